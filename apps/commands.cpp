@@ -1,0 +1,168 @@
+#include "commands.h"
+
+#include "inputfile.h"
+#include "qm_db/casefile.h"
+#include "qm_db/filectrl.h"
+#include "qm_db/modelstore.h"
+#include "qm_rps/pushovercurvedlg.h"
+#include "qm_rps/pushoverreport.h"
+#include "resultjson.h"
+#include "resulttable.h"
+
+#ifdef QM_UI
+#include "qm_ui/evaluationplot.h"
+#include "qm_ui/plotfile.h"
+#endif
+
+#include <cstdio>
+#include <vector>
+
+namespace {
+
+EXIT_CODE Complain(EXIT_CODE code, const std::string& text)
+{
+    std::fprintf(stderr, "qm-rps: %s\n", text.c_str());
+    return code;
+}
+
+/// Evaluates what was asked for; false after a message on stderr.
+EXIT_CODE EvaluateAll(CDBDoc& doc, const std::string& only, std::vector<T_PUSH_EVALUATION>& out)
+{
+    CPushOverCurveDlg driver(doc);
+    for (const auto& entry : doc.Data().Model().evaluations) {
+        if (!only.empty() && entry.second.name != only) continue;
+        T_EVAL_D eval;
+        if (!doc.Attr().GetEval(entry.first, eval)) continue;
+        if (!driver.SetEvaluation(eval))
+            return Complain(EXIT_CODE::BadInput, doc.Path() + ": evaluation \"" + eval.name +
+                                                     "\": " + driver.SettingsError());
+        driver.Evaluate();
+        out.push_back(driver.Result());
+    }
+    if (!out.empty()) return EXIT_CODE::Done;
+    if (only.empty()) return Complain(EXIT_CODE::BadInput, doc.Path() + ": no evaluations");
+    return Complain(EXIT_CODE::Usage, doc.Path() + ": no evaluation named \"" + only + "\"");
+}
+
+/// Writes to a file, or to standard output for "-".
+EXIT_CODE WriteOutput(const std::string& path, const std::string& text)
+{
+    if (path == "-") {
+        std::fwrite(text.data(), 1, text.size(), stdout);
+        return std::fflush(stdout) == 0
+                   ? EXIT_CODE::Done
+                   : Complain(EXIT_CODE::NoAccess, "standard output can't be written");
+    }
+    T_FILE_ERROR error;
+    return CFileCtrl::WriteWholeFile(path, text, error) ? EXIT_CODE::Done : ReportFileError(error);
+}
+
+/// The path itself for one evaluation; for several a number before the extension.
+std::string NumberedPath(const std::string& path, std::size_t index, std::size_t count)
+{
+    if (count == 1) return path;
+    const std::string stem = CFileCtrl::GetFilePathAndNameWithoutExtension(path);
+    return stem + "-" + std::to_string(index + 1) + path.substr(stem.size());
+}
+
+EXIT_CODE WritePlots(const std::string& path, const std::vector<T_PUSH_EVALUATION>& results)
+{
+#ifdef QM_UI
+    for (std::size_t i = 0; i < results.size(); ++i) {
+        const std::string file = NumberedPath(path, i, results.size());
+        std::string error;
+        if (!WritePlotFile(EvaluationPlot(results[i]), file, error))
+            return Complain(EXIT_CODE::NoAccess, error);
+    }
+    return EXIT_CODE::Done;
+#else
+    (void)results;
+    return Complain(EXIT_CODE::Usage, path + ": this qm-rps was built without pictures");
+#endif
+}
+
+/// Reports of several evaluations follow one another in one file.
+EXIT_CODE WriteReports(const std::string& path, const std::vector<T_PUSH_EVALUATION>& results,
+                       std::string (*print)(const T_PUSH_EVALUATION&))
+{
+    std::string text;
+    for (const T_PUSH_EVALUATION& e : results)
+        text += print(e);
+    return WriteOutput(path, text);
+}
+
+/// Keeps the limit-state steps that the evaluations found; a file that can't be written is no
+/// failure of the evaluation.
+void StoreSteps(CDBDoc& doc)
+{
+    T_FILE_ERROR error;
+    if (!doc.SaveModel(error))
+        std::fprintf(stderr, "qm-rps: the limit-state steps were not stored: %s\n",
+                     error.text.c_str());
+}
+
+EXIT_CODE WriteResults(const T_EVALUATE_OPTIONS& o, const std::vector<T_PUSH_EVALUATION>& results)
+{
+    EXIT_CODE code = EXIT_CODE::Done;
+    const auto ok = [&] { return code == EXIT_CODE::Done; };
+    if (!o.json.empty()) code = WriteOutput(o.json, ResultJson(results));
+    if (ok() && !o.report.empty()) code = WriteReports(o.report, results, PushoverReportText);
+    if (ok() && !o.curve.empty()) code = WriteReports(o.curve, results, PushoverCurveText);
+    if (ok() && !o.plot.empty()) code = WritePlots(o.plot, results);
+    return code;
+}
+
+} // namespace
+
+EXIT_CODE RunImport(const std::string& caseFile, const std::string& modelFile)
+{
+    CDBDoc doc;
+    T_FILE_ERROR error;
+    if (!doc.ImportCase(caseFile, error)) return ReportFileError(error);
+    if (!doc.SaveModelAs(modelFile, error)) return ReportFileError(error);
+    std::printf("%s", InfoText(doc).c_str());
+    return EXIT_CODE::Done;
+}
+
+EXIT_CODE RunExport(const std::string& modelFile, const std::string& caseFile)
+{
+    CDBDoc doc;
+    if (const EXIT_CODE code = OpenInput(doc, modelFile); code != EXIT_CODE::Done) return code;
+    T_FILE_ERROR error;
+    std::string text;
+    if (!CCaseFile::Print(doc.Data().Content(), text, error)) return ReportFileError(error);
+    return WriteOutput(caseFile, text);
+}
+
+EXIT_CODE RunInfo(const std::string& file, bool check)
+{
+    if (check && IsModelFile(file)) {
+        T_FILE_ERROR error;
+        if (!CModelStore::CheckWhole(file, error)) return ReportFileError(error);
+    }
+    CDBDoc doc;
+    if (const EXIT_CODE code = OpenInput(doc, file); code != EXIT_CODE::Done) return code;
+    std::printf("%s", InfoText(doc).c_str());
+    if (check) std::printf("  every table and every result block was read and is whole\n");
+    return EXIT_CODE::Done;
+}
+
+EXIT_CODE RunEvaluate(const T_EVALUATE_OPTIONS& o)
+{
+    CDBDoc doc;
+    if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
+    std::vector<T_PUSH_EVALUATION> results;
+    if (const EXIT_CODE code = EvaluateAll(doc, o.only, results); code != EXIT_CODE::Done)
+        return code;
+    if (const EXIT_CODE code = WriteResults(o, results); code != EXIT_CODE::Done) return code;
+    if (o.json != "-") std::printf("%s", ResultTable(results).c_str());
+    if (o.trace && o.json != "-") {
+        for (const T_PUSH_EVALUATION& e : results)
+            std::printf("%s", TraceTable(e).c_str());
+    }
+    if (IsModelFile(o.file) && !o.noStore && doc.Data().IsModified()) StoreSteps(doc);
+    for (const T_PUSH_EVALUATION& e : results) {
+        if (e.result == kPerfPtNone) return EXIT_CODE::NotFound;
+    }
+    return EXIT_CODE::Done;
+}

@@ -1,0 +1,22 @@
+// The commands of qm-rps, after their arguments have been read.
+#pragma once
+
+#include "exitcodes.h"
+
+#include <string>
+
+struct T_EVALUATE_OPTIONS {
+    std::string file;
+    std::string only;   // name of one evaluation; empty: all
+    std::string json;   // file, or "-" for standard output
+    std::string report; // text report
+    std::string curve;  // curve table alone
+    std::string plot;   // .svg, .png or .pdf
+    bool trace = false;
+    bool noStore = false; // don't store the limit-state steps in a model file
+};
+
+EXIT_CODE RunImport(const std::string& caseFile, const std::string& modelFile);
+EXIT_CODE RunExport(const std::string& modelFile, const std::string& caseFile);
+EXIT_CODE RunInfo(const std::string& file, bool check);
+EXIT_CODE RunEvaluate(const T_EVALUATE_OPTIONS& options);

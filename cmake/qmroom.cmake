@@ -1,0 +1,27 @@
+# One interface target carries the compile rules; qm_room() declares a room with them.
+
+add_library(qm_flags INTERFACE)
+target_compile_features(qm_flags INTERFACE cxx_std_20)
+target_compile_options(qm_flags INTERFACE
+  -Wall -Wextra -Wpedantic -Wconversion -Wshadow -Werror=unused-result
+  $<$<BOOL:${QM_WERROR}>:-Werror>)
+if(QM_SANITIZE)
+  target_compile_options(qm_flags INTERFACE -fsanitize=${QM_SANITIZE} -fno-omit-frame-pointer
+                                            -fno-sanitize-recover=all)
+  target_link_options(qm_flags INTERFACE -fsanitize=${QM_SANITIZE})
+endif()
+
+# qm_room(<name> SOURCES a.cpp ... [DEPENDS qm::x ...] [PRIVATE_DEPENDS lib ...])
+# makes the static library <name> with the alias qm::<short name>.
+function(qm_room name)
+  cmake_parse_arguments(ROOM "" "" "SOURCES;DEPENDS;PRIVATE_DEPENDS" ${ARGN})
+  string(REGEX REPLACE "^qm_" "" short ${name})
+  add_library(${name} STATIC ${ROOM_SOURCES})
+  add_library(qm::${short} ALIAS ${name})
+  set_target_properties(${name} PROPERTIES EXPORT_NAME ${short})
+  target_compile_features(${name} PUBLIC cxx_std_20)
+  target_include_directories(${name} PUBLIC $<BUILD_INTERFACE:${PROJECT_SOURCE_DIR}/src>
+                                            $<INSTALL_INTERFACE:${CMAKE_INSTALL_INCLUDEDIR}>)
+  target_link_libraries(${name} PUBLIC ${ROOM_DEPENDS}
+                        PRIVATE $<BUILD_INTERFACE:qm_flags> ${ROOM_PRIVATE_DEPENDS})
+endfunction()

@@ -1,0 +1,65 @@
+// Base of the models behind dialogs: how a model talks to the person, without any widget.
+#pragma once
+
+#include <string>
+#include <vector>
+
+namespace zql::frx {
+
+class MDialog;
+
+/// What stands between a dialog model and the person: a window, a script of answers, or stderr.
+class IDialogView {
+public:
+    IDialogView() = default;
+    IDialogView(const IDialogView&) = delete;
+    IDialogView& operator=(const IDialogView&) = delete;
+    virtual ~IDialogView() = default;
+    virtual void ShowMessage(const std::string& key, const std::string& text) = 0;
+    virtual bool AskYesNo(const std::string& key, const std::string& text) = 0;
+    /// Shows a child dialog; 1 accepted, 0 cancelled.
+    virtual int RunModal(MDialog& child) = 0;
+};
+
+struct T_MESSAGE {
+    std::string key;  // message key
+    std::string text; // text as shown
+    bool operator==(const T_MESSAGE&) const = default;
+};
+
+class MDialog {
+public:
+    MDialog() = default;
+    MDialog(const MDialog&) = delete;
+    MDialog& operator=(const MDialog&) = delete;
+    virtual ~MDialog() = default;
+
+    /// The view is not owned and must outlive the dialog or be reset to null.
+    void SetView(IDialogView* view) { m_view = view; }
+
+    /// Every message shown so far, oldest first.
+    const std::vector<T_MESSAGE>& Messages() const { return m_messages; }
+    void ClearMessages() { m_messages.clear(); }
+
+    /// The one pass over the dialog's data before it is accepted. 1 when all is well.
+    virtual int CheckData() { return 1; }
+    /// Accepts the dialog when its data pass. 1 accepted; 0 stays open.
+    virtual int OnOK() { return CheckData(); }
+
+    /// Runs this dialog in the installed view; without a view it is refused (0).
+    int DoModal();
+
+protected:
+    /// Keeps the message and shows it in the view, if any. The text comes from the catalogue.
+    void ShowMessage(const std::string& key);
+    void ShowMessage(const std::string& key, const std::string& text);
+    /// Asks the person; without a view the answer is no (nothing is guessed).
+    bool AskYesNo(const std::string& key);
+    IDialogView* View() const { return m_view; }
+
+private:
+    IDialogView* m_view = nullptr;
+    std::vector<T_MESSAGE> m_messages;
+};
+
+} // namespace zql::frx

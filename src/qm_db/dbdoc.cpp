@@ -1,0 +1,76 @@
+#include "qm_db/dbdoc.h"
+
+#include "qm_db/casefile.h"
+
+#include <utility>
+
+namespace {
+
+CDBDoc*& CurrentDoc()
+{
+    static CDBDoc* current = nullptr; // the documented switch: which document is current
+    return current;
+}
+
+} // namespace
+
+CDBDoc::CDBDoc()
+{
+    SetDocPoint(this);
+}
+
+CDBDoc::~CDBDoc()
+{
+    if (GetDocPoint() == this) SetDocPoint(nullptr);
+}
+
+CDBDoc* CDBDoc::GetDocPoint()
+{
+    return CurrentDoc();
+}
+void CDBDoc::SetDocPoint(CDBDoc* doc)
+{
+    CurrentDoc() = doc;
+}
+
+void CDBDoc::Reset(T_MODEL_CONTENT content, const std::string& path)
+{
+    m_data.Assign(std::move(content));
+    m_undo.Clear();
+    m_path = path;
+}
+
+int CDBDoc::OpenModel(const std::string& path, OPEN_MODE mode, T_FILE_ERROR& error)
+{
+    T_MODEL_CONTENT content;
+    if (!m_store.Open(path, mode, content, error)) return 0;
+    Reset(std::move(content), path);
+    return 1;
+}
+
+int CDBDoc::ImportCase(const std::string& path, T_FILE_ERROR& error)
+{
+    T_MODEL_CONTENT content;
+    if (!CCaseFile::Read(path, content, error)) return 0;
+    m_store.Close();
+    Reset(std::move(content), path);
+    return 1;
+}
+
+int CDBDoc::SaveModel(T_FILE_ERROR& error)
+{
+    return SaveModelAs(m_path, error);
+}
+
+int CDBDoc::SaveModelAs(const std::string& path, T_FILE_ERROR& error)
+{
+    if (!m_store.Save(path, m_data.Content(), error)) return 0;
+    m_path = path;
+    m_data.SetModified(false);
+    return 1;
+}
+
+int CDBDoc::ExportCase(const std::string& path, T_FILE_ERROR& error) const
+{
+    return CCaseFile::Write(path, m_data.Content(), error);
+}

@@ -1,0 +1,59 @@
+// A model document: records, results, units, undo, file.
+#pragma once
+
+#include "qm_base/dynmodule.h"
+#include "qm_db/attrctrl.h"
+#include "qm_db/editdata.h"
+#include "qm_db/initctrl.h"
+#include "qm_db/postctrl.h"
+#include "qm_db/unitctrl.h"
+
+class CDBDoc {
+public:
+    CDBDoc();
+    ~CDBDoc();
+    CDBDoc(const CDBDoc&) = delete;
+    CDBDoc& operator=(const CDBDoc&) = delete;
+
+    /// The current document, or null. A document is current from its making until it ends or
+    /// another one is made current.
+    static CDBDoc* GetDocPoint();
+    static void SetDocPoint(CDBDoc* doc);
+
+    CDataCtrl& Data() { return m_data; }
+    const CDataCtrl& Data() const { return m_data; }
+    CAttrCtrl& Attr() { return m_attr; }
+    CPostCtrl& Post() { return m_post; }
+    CUnitCtrl& Unit() { return m_unit; }
+    CInitCtrl& Init() { return m_init; }
+    CUndoCtrl& Undo() { return m_undo; }
+    CEditData& Edit() { return m_edit; }
+    CDynModuleMgr& DynModules() { return m_modules; }
+
+    /// Opens a model file (see CModelStore::Open) or reads a case file. 1 done; 0 error filled
+    /// and the document as it was.
+    [[nodiscard]] int OpenModel(const std::string& path, OPEN_MODE mode, T_FILE_ERROR& error);
+    [[nodiscard]] int ImportCase(const std::string& path, T_FILE_ERROR& error);
+    /// Saves to the file it was opened from, or to another one. 1 done; 0 error filled, the file
+    /// on disk as it was.
+    [[nodiscard]] int SaveModel(T_FILE_ERROR& error);
+    [[nodiscard]] int SaveModelAs(const std::string& path, T_FILE_ERROR& error);
+    [[nodiscard]] int ExportCase(const std::string& path, T_FILE_ERROR& error) const;
+
+    /// Path of the model or case file; empty for a new document.
+    const std::string& Path() const { return m_path; }
+
+private:
+    void Reset(T_MODEL_CONTENT content, const std::string& path);
+
+    CDataCtrl m_data;
+    CAttrCtrl m_attr{m_data};
+    CPostCtrl m_post{m_data};
+    CUnitCtrl m_unit{m_data};
+    CInitCtrl m_init{m_data};
+    CUndoCtrl m_undo{m_data};
+    CEditData m_edit{m_data, m_undo};
+    CDynModuleMgr m_modules;
+    CModelStore m_store;
+    std::string m_path;
+};

@@ -1,0 +1,44 @@
+#include "qm_db/editdata.h"
+
+#include <ranges>
+#include <utility>
+
+int CEditData::Begin(std::string title)
+{
+    if (m_open) return 0;
+    m_step = {std::move(title), {}};
+    m_open = true;
+    return 1;
+}
+
+int CEditData::Commit()
+{
+    if (!m_open) return 0;
+    m_open = false;
+    if (!m_step.changes.empty()) m_undo.Push(std::exchange(m_step, {}));
+    return 1;
+}
+
+void CEditData::Rollback()
+{
+    if (!m_open) return;
+    m_open = false;
+    T_MODEL& model = m_data.ModelForEdit();
+    for (const T_CHANGE_ANY& change : m_step.changes | std::views::reverse)
+        CUndoCtrl::Apply(model, change, false);
+    m_step = {};
+}
+
+int CEditData::PutStyp(T_STYP_D styp)
+{
+    if (!m_open) return 0;
+    RecordToSi(styp, styp.units);
+    return Record(T_CHANGE<T_STYP_D>{0, m_data.Model().styp, std::move(styp)});
+}
+
+int CEditData::Record(T_CHANGE_ANY change)
+{
+    CUndoCtrl::Apply(m_data.ModelForEdit(), change, true);
+    m_step.changes.push_back(std::move(change));
+    return 1;
+}

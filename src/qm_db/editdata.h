@@ -1,0 +1,54 @@
+// Edits of records: gathered in a step, committed as one undoable command or rolled back whole.
+#pragma once
+
+#include "qm_db/recordunits.h"
+#include "qm_db/undoctrl.h"
+
+class CEditData {
+public:
+    CEditData(CDataCtrl& data, CUndoCtrl& undo) : m_data(data), m_undo(undo) {}
+
+    /// Starts a step. 1 started; 0 another one is open.
+    [[nodiscard]] int Begin(std::string title);
+    /// Ends the step and makes it undoable. 1 done; 0 none was open.
+    [[nodiscard]] int Commit();
+    /// Takes every change of the open step back.
+    void Rollback();
+    bool IsOpen() const { return m_open; }
+
+    /// Adds or replaces the record with that key; quantities in the document's current units.
+    /// 1 done; 0 no step is open.
+    template <class T>
+    [[nodiscard]] int Put(int key, T record)
+    {
+        RecordToSi(record, m_data.Units());
+        return Change<T>(key, std::move(record));
+    }
+    /// Deletes the record. 1 done; 0 no step is open or there is no such record.
+    template <class T>
+    [[nodiscard]] int Erase(int key)
+    {
+        if (!TableOf<T>(m_data.ModelForEdit()).contains(key)) return 0;
+        return Change<T>(key, std::nullopt);
+    }
+    /// Title, current units and gravity (in the units that the record itself names). Changing
+    /// the units changes no stored quantity.
+    [[nodiscard]] int PutStyp(T_STYP_D styp);
+
+private:
+    template <class T>
+    int Change(int key, std::optional<T> after)
+    {
+        if (!m_open) return 0;
+        const auto& table = TableOf<T>(m_data.ModelForEdit());
+        T_CHANGE<T> change{key, std::nullopt, std::move(after)};
+        if (const auto it = table.find(key); it != table.end()) change.before = it->second;
+        return Record(std::move(change));
+    }
+    int Record(T_CHANGE_ANY change);
+
+    CDataCtrl& m_data;
+    CUndoCtrl& m_undo;
+    T_UNDO_STEP m_step;
+    bool m_open = false;
+};

@@ -1,0 +1,168 @@
+#include "qm_db/filectrl.h"
+
+#include "qm_base/textformat.h"
+
+#include <algorithm>
+#include <cerrno>
+#include <csignal>
+#include <cstring>
+#include <ctime>
+#include <fcntl.h>
+#include <filesystem>
+#include <sys/stat.h>
+#include <unistd.h>
+
+namespace {
+
+/// An open file that is closed at the end of its scope.
+class CFileHandle {
+public:
+    explicit CFileHandle(int fd) : m_fd(fd) {}
+    CFileHandle(const CFileHandle&) = delete;
+    CFileHandle& operator=(const CFileHandle&) = delete;
+    ~CFileHandle()
+    {
+        if (m_fd >= 0) close(m_fd);
+    }
+    int Get() const { return m_fd; }
+    /// Closes now; some file systems report a failed write only here.
+    bool Close()
+    {
+        const int fd = m_fd;
+        m_fd = -1;
+        return close(fd) == 0;
+    }
+
+private:
+    int m_fd;
+};
+
+/// Turns the signal of a file-size limit into the error EFBIG while it lives: a full quota must
+/// end in a message, not in the end of the process.
+class CSizeSignalBlock {
+public:
+    CSizeSignalBlock()
+    {
+        sigemptyset(&m_signal);
+        sigaddset(&m_signal, SIGXFSZ);
+        pthread_sigmask(SIG_BLOCK, &m_signal, &m_before);
+    }
+    CSizeSignalBlock(const CSizeSignalBlock&) = delete;
+    CSizeSignalBlock& operator=(const CSizeSignalBlock&) = delete;
+    ~CSizeSignalBlock()
+    {
+        const std::timespec now{};
+        sigtimedwait(&m_signal, nullptr, &now); // takes the one that is pending
+        pthread_sigmask(SIG_SETMASK, &m_before, nullptr);
+    }
+
+private:
+    sigset_t m_signal;
+    sigset_t m_before;
+};
+
+int Refuse(const std::string& path, const char* action, int code, T_FILE_ERROR& error)
+{
+    error = {FILE_FAULT::NoAccess, path + ": can't " + action + ": " + std::strerror(code)};
+    return 0;
+}
+
+bool WriteAll(int fd, std::string_view text)
+{
+    while (!text.empty()) {
+        const ssize_t count = write(fd, text.data(), text.size());
+        if (count < 0 && errno == EINTR) continue;
+        if (count == 0) errno = ENOSPC;
+        if (count <= 0) return false;
+        text.remove_prefix(static_cast<std::size_t>(count));
+    }
+    return true;
+}
+
+/// The file that a write replaces: a link keeps pointing at it.
+std::string TargetOf(const std::string& path)
+{
+    std::error_code ignored;
+    if (!std::filesystem::is_symlink(path, ignored)) return path;
+    const auto target = std::filesystem::canonical(path, ignored);
+    return ignored ? path : target.string();
+}
+
+/// Fills a new file and makes sure that the bytes are on the disk.
+bool WriteNewFile(const std::string& path, mode_t mode, bool setMode, std::string_view text)
+{
+    CFileHandle file(open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, mode));
+    return file.Get() >= 0 && (!setMode || fchmod(file.Get(), mode) == 0) &&
+           WriteAll(file.Get(), text) && fsync(file.Get()) == 0 && file.Close();
+}
+
+/// The rename is in place already: a folder that can't be synced is not a failure of the write.
+void SyncFolder(const std::string& path)
+{
+    const std::string folder = std::filesystem::path(path).parent_path().string();
+    const CFileHandle handle(
+        open(folder.empty() ? "." : folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+    if (handle.Get() >= 0) fsync(handle.Get());
+}
+
+/// Devices and pipes have no old content to keep.
+int WriteSpecial(const std::string& path, std::string_view text, T_FILE_ERROR& error)
+{
+    CFileHandle file(open(path.c_str(), O_WRONLY | O_CLOEXEC));
+    if (file.Get() < 0 || !WriteAll(file.Get(), text) || !file.Close())
+        return Refuse(path, "write", errno, error);
+    return 1;
+}
+
+} // namespace
+
+std::string CFileCtrl::GetFilePathAndNameWithoutExtension(const std::string& path)
+{
+    return std::filesystem::path(path).replace_extension().string();
+}
+
+int CFileCtrl::WriteWholeFile(const std::string& path, std::string_view text, T_FILE_ERROR& error)
+{
+    const CSizeSignalBlock block;
+    const std::string target = TargetOf(path);
+    struct stat old {};
+    const bool exists = stat(target.c_str(), &old) == 0;
+    if (exists && S_ISDIR(old.st_mode)) return Refuse(path, "write", EISDIR, error);
+    if (exists && !S_ISREG(old.st_mode)) return WriteSpecial(target, text, error);
+    if (exists && access(target.c_str(), W_OK) != 0) return Refuse(path, "write", errno, error);
+
+    const std::string temporary = target + FormatText(".tmp-%ld", static_cast<long>(getpid()));
+    unlink(temporary.c_str()); // left by a dead process of the same number
+    if (!WriteNewFile(temporary, exists ? old.st_mode & 07777 : 0666, exists, text) ||
+        rename(temporary.c_str(), target.c_str()) != 0) {
+        const int code = errno;
+        unlink(temporary.c_str());
+        return Refuse(path, "write", code, error);
+    }
+    SyncFolder(target);
+    return 1;
+}
+
+int CFileCtrl::ReadWholeFile(const std::string& path, std::string& text, T_FILE_ERROR& error)
+{
+    const CFileHandle file(open(path.c_str(), O_RDONLY | O_CLOEXEC));
+    if (file.Get() < 0) return Refuse(path, "open", errno, error);
+    struct stat info {};
+    if (fstat(file.Get(), &info) != 0) return Refuse(path, "read", errno, error);
+
+    std::string whole;
+    std::size_t used = 0;
+    const std::size_t expected = info.st_size > 0 ? static_cast<std::size_t>(info.st_size) : 0;
+    whole.resize(expected + 1); // one more: the end shows without growing
+    for (;;) {
+        if (used == whole.size()) whole.resize(2 * whole.size());
+        const ssize_t count = read(file.Get(), whole.data() + used, whole.size() - used);
+        if (count < 0 && errno == EINTR) continue;
+        if (count < 0) return Refuse(path, "read", errno, error);
+        if (count == 0) break;
+        used += static_cast<std::size_t>(count);
+    }
+    whole.resize(used);
+    text = std::move(whole);
+    return 1;
+}

@@ -1,0 +1,15 @@
+// Why a file operation was refused.
+#pragma once
+
+#include <string>
+
+enum class FILE_FAULT {
+    None,
+    BadInput, // the content is wrong: foreign, damaged, an invalid value
+    NoAccess  // the file can't be opened, read, locked or written
+};
+
+struct T_FILE_ERROR {
+    FILE_FAULT fault = FILE_FAULT::None;
+    std::string text; // one line: file, place, reason
+};

@@ -1,0 +1,69 @@
+#include "qm_db/jsonnumber.h"
+
+#include <array>
+#include <charconv>
+#include <cmath>
+#include <limits>
+
+namespace {
+
+constexpr double kFixedFrom = 1e-5;
+constexpr double kFixedTo = 1e15;
+
+/// The value rounded to that many significant digits.
+double Rounded(double value, int digits)
+{
+    std::array<char, 40> text;
+    const auto end = std::to_chars(text.data(), text.data() + text.size(), value,
+                                   std::chars_format::scientific, digits - 1);
+    double rounded = 0.0;
+    std::from_chars(text.data(), end.ptr, rounded);
+    return rounded;
+}
+
+/// Shortest text of a double near `guess` that times `factor` gives `si` to the bit. A text of up
+/// to 15 digits is found by rounding: the guess is at most two units in the last place away.
+std::optional<std::string> ExactText(double si, double guess, double factor)
+{
+    const double short15 = Rounded(guess, 15);
+    if (short15 * factor == si) return NumberText(short15);
+
+    std::optional<std::string> best;
+    const auto consider = [&](double candidate) {
+        if (candidate * factor != si) return;
+        std::string text = NumberText(candidate);
+        if (!best || text.size() < best->size()) best = std::move(text);
+    };
+    constexpr double inf = std::numeric_limits<double>::infinity();
+    const double below = std::nextafter(guess, -inf);
+    const double above = std::nextafter(guess, inf);
+    for (const double candidate : {guess, Rounded(guess, 16), below, above,
+                                   std::nextafter(below, -inf), std::nextafter(above, inf)})
+        consider(candidate);
+    return best;
+}
+
+} // namespace
+
+std::string NumberText(double value)
+{
+    if (value == 0.0) return std::signbit(value) ? "-0.0" : "0";
+    const double size = std::fabs(value);
+    const auto format = size >= kFixedFrom && size < kFixedTo ? std::chars_format::fixed
+                                                              : std::chars_format::scientific;
+    std::array<char, 40> text;
+    const auto end = std::to_chars(text.data(), text.data() + text.size(), value, format);
+    return {text.data(), end.ptr};
+}
+
+std::optional<std::string> SiText(double si, const T_UNITS& units, T_DIM dim)
+{
+    const double factor = SiFactor(units, dim);
+    const double guess = si / factor;
+    if (!std::isfinite(si) || !std::isfinite(guess)) return std::nullopt;
+    if (factor == 1.0 || si == 0.0) return NumberText(si);
+    if (auto text = ExactText(si, guess, factor)) return text;
+    // No double times the factor gives the stored value; the guess gives its neighbour.
+    if (!std::isfinite(guess * factor)) return std::nullopt;
+    return NumberText(guess);
+}

@@ -1,0 +1,106 @@
+#include "qm_db/modelschema.h"
+
+#include "qm_base/msgfunction.h"
+#include "qm_db/sqlitedb.h"
+#include "qm_db/sqlitestmt.h"
+#include "qm_db/storefault.h"
+
+#include <algorithm>
+
+namespace {
+
+// Scalars are typed columns, quantities in SI. Bit i of negative_zeros says that the i-th column
+// of the row is -0.0: a REAL column stores a whole number as an integer, which has no such value.
+// Every list of numbers (node ids, coordinates, mode shapes, spectrum tables) is a row of "arrays":
+// `count` numbers of `width` bytes, 'i' integers or 'f' IEEE floating point numbers, packed.
+// A change here is a new schema version and a migration.
+constexpr const char* kTables[] = {
+    "CREATE TABLE model(key INTEGER PRIMARY KEY, title TEXT NOT NULL, force_unit TEXT NOT NULL, "
+    "length_unit TEXT NOT NULL, gravity REAL, negative_zeros INTEGER NOT NULL) STRICT",
+
+    "CREATE TABLE storeys(key INTEGER PRIMARY KEY, name TEXT NOT NULL, height REAL NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+
+    "CREATE TABLE modes(key INTEGER PRIMARY KEY, period REAL NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+
+    "CREATE TABLE spectra(key INTEGER PRIMARY KEY, name TEXT NOT NULL, kind TEXT NOT NULL, "
+    "Ca REAL, Cv REAL, floors INTEGER, type INTEGER, soil TEXT, topography INTEGER, ag REAL, "
+    "damping REAL, S REAL, TB REAL, TC REAL, TD REAL, "
+    "SLO_ag REAL, SLO_F0 REAL, SLO_TCstar REAL, SLD_ag REAL, SLD_F0 REAL, SLD_TCstar REAL, "
+    "SLV_ag REAL, SLV_F0 REAL, SLV_TCstar REAL, SLC_ag REAL, SLC_F0 REAL, SLC_TCstar REAL, "
+    "gravity REAL, negative_zeros INTEGER NOT NULL) STRICT",
+
+    "CREATE TABLE pushovers(key INTEGER PRIMARY KEY, name TEXT NOT NULL, "
+    "control_node INTEGER NOT NULL, direction INTEGER NOT NULL, pattern_kind INTEGER NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+
+    "CREATE TABLE evaluations(key INTEGER PRIMARY KEY, name TEXT NOT NULL, push TEXT NOT NULL, "
+    "method INTEGER NOT NULL, procedure TEXT, spectrum TEXT NOT NULL, behavior INTEGER, "
+    "elastic_damping REAL, eigen_factors INTEGER, masonry INTEGER, drift_kind INTEGER, "
+    "plot_type INTEGER, alpha_in_percent INTEGER, has_bilinear INTEGER NOT NULL, "
+    "bilinear_rule TEXT, bilinear_secant REAL, bilinear_drop REAL, bilinear_iterate INTEGER, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+
+    "CREATE TABLE limit_state_steps(key INTEGER PRIMARY KEY, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+
+    "CREATE TABLE arrays(owner TEXT NOT NULL, key INTEGER NOT NULL, name TEXT NOT NULL, "
+    "kind TEXT NOT NULL, count INTEGER NOT NULL, width INTEGER NOT NULL, "
+    "byte_order TEXT NOT NULL, data BLOB NOT NULL, PRIMARY KEY(owner, key, name)) "
+    "STRICT, WITHOUT ROWID",
+
+    "CREATE TABLE results(key INTEGER PRIMARY KEY, steps INTEGER NOT NULL, "
+    "nodes INTEGER NOT NULL, negative_zeros INTEGER NOT NULL) STRICT",
+
+    // part: 0 load factors, 1 base reactions, 2 ids of 512 nodes, 3 displacements of 512 nodes in
+    // one step; chunk and step count from 0 and are 0 where they mean nothing.
+    "CREATE TABLE result_blocks(pushover INTEGER NOT NULL, part INTEGER NOT NULL, "
+    "chunk INTEGER NOT NULL, step INTEGER NOT NULL, count INTEGER NOT NULL, "
+    "width INTEGER NOT NULL, byte_order TEXT NOT NULL, checksum INTEGER NOT NULL, "
+    "data BLOB NOT NULL, PRIMARY KEY(pushover, part, chunk, step)) STRICT, WITHOUT ROWID",
+
+    "CREATE TABLE checksums(name TEXT PRIMARY KEY, value INTEGER NOT NULL) STRICT, WITHOUT ROWID"};
+
+} // namespace
+
+const T_SCHEMA& CurrentSchema()
+{
+    static constexpr T_SCHEMA kSchema{1, {}}; // version 1 is the first: nothing to migrate yet
+    return kSchema;
+}
+
+void CreateSchema(const CSqliteDb& db)
+{
+    for (const char* const sql : kTables)
+        db.Exec(sql);
+    db.Exec("PRAGMA application_id = " + std::to_string(kModelApplicationId));
+    db.Exec("PRAGMA user_version = " + std::to_string(CurrentSchema().version));
+}
+
+void CheckSchema(const CSqliteDb& db)
+{
+    CSqliteStmt stmt(db, "SELECT type, sql FROM sqlite_schema ORDER BY rowid");
+    std::size_t count = 0;
+    bool same = true;
+    while (same && stmt.Step()) {
+        same =
+            count < std::size(kTables) && stmt.Text(0) == "table" && stmt.Text(1) == kTables[count];
+        ++count;
+    }
+    if (!same || count != std::size(kTables))
+        ThrowDamaged(zql::lib::MMSGFunction::GetValue("IDS_QM_DB_DAMAGE_SCHEMA"));
+}
+
+void Migrate(const CSqliteDb& db, int from, const T_SCHEMA& schema)
+{
+    for (int version = from; version < schema.version; ++version) {
+        const auto step = std::find_if(schema.migrations.begin(), schema.migrations.end(),
+                                       [&](const T_MIGRATION& m) { return m.from == version; });
+        if (step == schema.migrations.end()) {
+            throw CStoreFault(FILE_FAULT::BadInput, "IDS_QM_DB_FILE_TOO_OLD", std::to_string(from),
+                              std::to_string(schema.version));
+        }
+        step->up(db);
+    }
+}

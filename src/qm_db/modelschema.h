@@ -1,0 +1,42 @@
+// Tables of the model file, its marks, and the way up from older versions.
+#pragma once
+
+#include <array>
+#include <cstdint>
+#include <span>
+#include <string>
+
+class CSqliteDb;
+
+/// In the SQLite header: whose database it is.
+inline constexpr std::uint32_t kModelApplicationId = 0x716D6462; // "qmdb"
+
+/// Brings a database from schema version `from` to `from` + 1. May throw CStoreFault.
+struct T_MIGRATION {
+    int from;
+    void (*up)(const CSqliteDb& db);
+};
+
+struct T_SCHEMA {
+    int version;                             // what this program writes
+    std::span<const T_MIGRATION> migrations; // any order; one per older version that can be read
+};
+
+/// Tables with a checksum of their own, in the order of writing. "sqlite_schema" (the text of the
+/// schema itself) is summed too; result_blocks is summed without the data, which have their own.
+inline constexpr std::array<const char*, 9> kModelTables{
+    "model",       "storeys",           "modes",  "spectra", "pushovers",
+    "evaluations", "limit_state_steps", "arrays", "results"};
+inline constexpr const char* kBlockTable = "result_blocks";
+inline constexpr const char* kSumTable = "checksums";
+
+const T_SCHEMA& CurrentSchema();
+
+/// Makes the tables of the current version and sets application id and version.
+void CreateSchema(const CSqliteDb& db);
+
+/// Throws "damaged" unless the schema is, statement by statement, the current one.
+void CheckSchema(const CSqliteDb& db);
+
+/// Walks the database up to the schema's version; throws when a step is missing.
+void Migrate(const CSqliteDb& db, int from, const T_SCHEMA& schema);

@@ -1,0 +1,95 @@
+#include "qm_db/modelstore.h"
+
+#include "qm_db/modellock.h"
+#include "qm_db/modelreader.h"
+#include "qm_db/modeltemp.h"
+#include "qm_db/storefault.h"
+
+#include <cerrno>
+#include <filesystem>
+#include <unistd.h>
+
+namespace fs = std::filesystem;
+
+namespace {
+
+/// The door of this room: runs `work`; what it throws becomes the error.
+template <class F>
+int Guarded(const std::string& path, T_FILE_ERROR& error, const F& work)
+{
+    try {
+        work();
+        error = {};
+        return 1;
+    } catch (const CStoreFault& fault) {
+        error = fault.ForFile(path);
+    } catch (const std::exception& fault) {
+        error = {FILE_FAULT::NoAccess, path + ": " + fault.what()};
+    }
+    return 0;
+}
+
+/// The file behind a link, so that a save replaces the file and not the link.
+std::string RealPath(const std::string& path)
+{
+    std::error_code none;
+    const fs::path real = fs::canonical(path, none);
+    return none ? path : real.string();
+}
+
+/// The model and all sums were right after reading back; is it the model that was meant?
+void Verify(const std::string& path, const T_MODEL& model)
+{
+    const T_MODEL_CONTENT read = ReadModelFile(path, CurrentSchema(), CHECK_DEPTH::Whole);
+    if (read.model != model) throw CStoreFault(FILE_FAULT::BadInput, "IDS_QM_DB_FILE_NOT_SAVED");
+}
+
+} // namespace
+
+CModelStore::CModelStore() = default;
+CModelStore::~CModelStore() = default;
+
+int CModelStore::Open(const std::string& path, OPEN_MODE mode, T_MODEL_CONTENT& out,
+                      T_FILE_ERROR& error)
+{
+    return Guarded(path, error, [&] {
+        std::unique_ptr<CModelLock> lock;
+        const bool held = mode == OPEN_MODE::Edit && m_lock && m_lock->Holds(path);
+        if (mode == OPEN_MODE::Edit) {
+            if (!held) lock = CModelLock::Take(path);
+            CModelTemp::SweepStale(RealPath(path));
+        }
+        out = ReadModelFile(path, CurrentSchema(), CHECK_DEPTH::BySize);
+        if (!held) m_lock = std::move(lock);
+    });
+}
+
+int CModelStore::Save(const std::string& path, const T_MODEL_CONTENT& content, T_FILE_ERROR& error)
+{
+    return Guarded(path, error, [&] {
+        const std::string target = RealPath(path);
+        std::unique_ptr<CModelLock> lock; // of the file that is replaced
+        std::error_code ignored;
+        if (fs::exists(target, ignored)) {
+            if (!m_lock || !m_lock->Holds(target)) lock = CModelLock::Take(target);
+            if (::access(target.c_str(), W_OK) != 0)
+                ThrowSystem("IDS_QM_DB_FILE_CANT_WRITE", errno);
+        }
+        CModelTemp temp(target);
+        WriteModelFile(temp.Path(), content);
+        temp.Flush();
+        Verify(temp.Path(), content.model);
+        m_lock = temp.ReplaceTarget();
+    });
+}
+
+int CModelStore::CheckWhole(const std::string& path, T_FILE_ERROR& error)
+{
+    return Guarded(path, error,
+                   [&] { (void)ReadModelFile(path, CurrentSchema(), CHECK_DEPTH::Whole); });
+}
+
+void CModelStore::Close()
+{
+    m_lock.reset();
+}

@@ -1,0 +1,257 @@
+#include "qm_db/postctrl.h"
+
+#include "qm_db/storyload.h"
+
+#include <algorithm>
+#include <cmath>
+
+void CPoverInfo::SetStepEC8(int loadCase, int stepDL, int stepSD, int stepNC)
+{
+    m_data.ModelForEdit().poverSteps[loadCase].ec8 = {stepDL, stepSD, stepNC};
+}
+
+void CPoverInfo::SetStepNTC2008(int loadCase, int stepSLD, int stepSLV, int stepSLC)
+{
+    m_data.ModelForEdit().poverSteps[loadCase].ntc = {stepSLD, stepSLV, stepSLC};
+}
+
+int CPoverInfo::GetStepEC8(int loadCase, std::array<int, 3>& out) const
+{
+    const auto it = m_data.Model().poverSteps.find(loadCase);
+    if (it == m_data.Model().poverSteps.end() || !it->second.ec8) return 0;
+    out = *it->second.ec8;
+    return 1;
+}
+
+int CPoverInfo::GetStepNTC2008(int loadCase, std::array<int, 3>& out) const
+{
+    const auto it = m_data.Model().poverSteps.find(loadCase);
+    if (it == m_data.Model().poverSteps.end() || !it->second.ntc) return 0;
+    out = *it->second.ntc;
+    return 1;
+}
+
+int CPostCtrl::GetNumEigvPost() const
+{
+    return static_cast<int>(m_data.Model().modes.size());
+}
+
+int CPostCtrl::SelectMode(int mode)
+{
+    if (!m_data.Model().modes.contains(mode)) return 0;
+    m_mode = mode;
+    return 1;
+}
+
+void CPostCtrl::GetEiMode(int node, T_DOF6& out) const
+{
+    out = {};
+    const auto mode = m_data.Model().modes.find(m_mode);
+    if (mode == m_data.Model().modes.end()) return;
+    const auto it = mode->second.shape.find(node);
+    if (it != mode->second.shape.end()) out = it->second;
+}
+
+// L and M of the participation factor in the three translations; rotations have no nodal inertia.
+void CPostCtrl::DeriveParticipation(const T_EIGV_D& mode, T_MPAF_D& factor, T_MPAM_D& percent) const
+{
+    std::array<double, 3> L{}, total{};
+    double M = 0.0;
+    for (const T_NODAL_MASS& nodal : CStoryLoad(m_data).Calc_Nodal_Mass()) {
+        const auto it = mode.shape.find(nodal.node);
+        for (std::size_t d = 0; d < 3; ++d) {
+            total[d] += nodal.mass[d];
+            if (it == mode.shape.end()) continue;
+            L[d] += nodal.mass[d] * it->second[d];
+            M += nodal.mass[d] * it->second[d] * it->second[d];
+        }
+    }
+    for (std::size_t d = 0; d < 3 && M > 0.0; ++d) {
+        factor.factor[d] = L[d] / M;
+        if (total[d] > 0.0) percent.percent[d] = 100.0 * L[d] * L[d] / (M * total[d]);
+    }
+}
+
+int CPostCtrl::GetEiMpafNeutral(int mode, T_MPAF_D& out) const
+{
+    const auto it = m_data.Model().modes.find(mode);
+    if (it == m_data.Model().modes.end()) return 0;
+    T_MPAF_D factor;
+    T_MPAM_D percent;
+    if (it->second.participation)
+        factor.factor = *it->second.participation;
+    else
+        DeriveParticipation(it->second, factor, percent);
+    out = factor;
+    return 1;
+}
+
+int CPostCtrl::GetEiMpam(int mode, T_MPAM_D& out) const
+{
+    const auto it = m_data.Model().modes.find(mode);
+    if (it == m_data.Model().modes.end()) return 0;
+    T_MPAF_D factor;
+    T_MPAM_D percent;
+    if (it->second.massPercent)
+        percent.percent = *it->second.massPercent;
+    else
+        DeriveParticipation(it->second, factor, percent);
+    out = percent;
+    return 1;
+}
+
+IPushResult* CPostCtrl::Source() const
+{
+    const auto it = m_data.Content().results.find(m_pushover);
+    return it == m_data.Content().results.end() ? nullptr : it->second.get();
+}
+
+int CPostCtrl::Direction() const
+{
+    const auto it = m_data.Model().pushovers.find(m_pushover);
+    return it == m_data.Model().pushovers.end() ? 0 : it->second.direction - 1;
+}
+
+T_DIM CPostCtrl::DispDim() const
+{
+    return Direction() < 3 ? kDimLength : kDimNone;
+}
+T_DIM CPostCtrl::ReacDim() const
+{
+    return Direction() < 3 ? kDimForce : kDimMoment;
+}
+
+int CPostCtrl::SelectPushover(int loadCase)
+{
+    const int before = m_pushover;
+    m_pushover = loadCase;
+    if (!Source() || !m_data.Model().pushovers.contains(loadCase)) {
+        m_pushover = before;
+        return 0;
+    }
+    if (before != loadCase || m_revision != m_data.Revision()) {
+        m_series.clear();
+        m_factors.clear();
+        m_reactions.clear();
+        m_revision = m_data.Revision();
+    }
+    m_step = 0;
+    return 1;
+}
+
+int CPostCtrl::GetStepCount() const
+{
+    return Source() ? Source()->StepCount() : 0;
+}
+
+int CPostCtrl::SelectStep(int step)
+{
+    if (step < 1 || step > GetStepCount()) return 0;
+    m_step = step;
+    return 1;
+}
+
+int CPostCtrl::ReadCurve()
+{
+    IPushResult* source = Source();
+    if (!source || m_step < 1) return 0;
+    if (!m_factors.empty()) return 1;
+    if (!source->ReadLoadFactors(m_factors) || !source->ReadBaseReactions(m_reactions)) {
+        m_error = source->Error();
+        m_factors.clear();
+        return 0;
+    }
+    for (double& r : m_reactions)
+        r = FromSi(r, m_data.Units(), ReacDim());
+    return 1;
+}
+
+int CPostCtrl::ReadSeries(int node, const std::vector<double>*& out)
+{
+    const auto known = m_series.find(node);
+    if (known != m_series.end()) {
+        out = &known->second;
+        return 1;
+    }
+    IPushResult* source = Source();
+    if (!source || !source->HasNode(node)) return 0;
+    std::vector<double> values;
+    if (!source->ReadDisplacements(node, values)) {
+        m_error = source->Error();
+        return 0;
+    }
+    for (double& v : values)
+        v = FromSi(v, m_data.Units(), DispDim());
+    out = &(m_series[node] = std::move(values));
+    return 1;
+}
+
+int CPostCtrl::GetStepFactor_PO(double& factor)
+{
+    if (!ReadCurve()) return 0;
+    factor = m_factors[static_cast<std::size_t>(m_step - 1)];
+    return 1;
+}
+
+int CPostCtrl::GetReacNew(double& reaction)
+{
+    if (!ReadCurve()) return 0;
+    reaction = m_reactions[static_cast<std::size_t>(m_step - 1)];
+    return 1;
+}
+
+int CPostCtrl::GetDispNew(int node, double& displacement)
+{
+    const std::vector<double>* series = nullptr;
+    if (m_step < 1 || !ReadSeries(node, series)) return 0;
+    displacement = (*series)[static_cast<std::size_t>(m_step - 1)];
+    return 1;
+}
+
+bool CPostCtrl::ExistNodePost(int node) const
+{
+    return Source() && Source()->HasNode(node);
+}
+
+// Mean displacement of a storey's nodes that have results; weighted by mass where asked for and
+// where the storey has mass in the direction.
+double CPostCtrl::StoreyMean(const T_STOR_D& storey, std::size_t step, bool byMass, int direction)
+{
+    double sum = 0.0, weight = 0.0, plain = 0.0;
+    int count = 0;
+    for (const int node : storey.nodes) {
+        const std::vector<double>* series = nullptr;
+        if (!ReadSeries(node, series)) continue;
+        const auto it = m_data.Model().nodes.find(node);
+        const double m = byMass && direction < 3 && it != m_data.Model().nodes.end()
+                             ? it->second.mass[static_cast<std::size_t>(direction)]
+                             : 0.0;
+        sum += m * (*series)[step];
+        weight += m;
+        plain += (*series)[step];
+        ++count;
+    }
+    if (byMass && weight > 0.0) return sum / weight;
+    return count > 0 ? plain / count : 0.0;
+}
+
+int CPostCtrl::GetPushoverStoryDriftRatio(int loadCase, int step, double& kind1, double& kind2)
+{
+    const auto& storeys = m_data.Model().storeys;
+    if (storeys.empty() || !SelectPushover(loadCase) || !SelectStep(step)) return 0;
+    const auto index = static_cast<std::size_t>(step - 1);
+    std::array<double, 2> below{}, largest{};
+    for (const auto& entry : storeys) {
+        const T_STOR_D& storey = entry.second;
+        const double h = FromSi(storey.height, m_data.Units(), kDimLength);
+        for (std::size_t k = 0; k < 2; ++k) {
+            const double u = StoreyMean(storey, index, k == 1, Direction());
+            if (h > 0.0) largest[k] = std::max(largest[k], std::fabs(u - below[k]) / h);
+            below[k] = u;
+        }
+    }
+    if (!m_error.empty()) return 0;
+    kind1 = largest[0];
+    kind2 = largest[1];
+    return 1;
+}

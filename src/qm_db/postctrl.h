@@ -1,0 +1,96 @@
+// Reading results: eigen modes and pushover steps, in the document's current units.
+#pragma once
+
+#include "qm_db/datactrl.h"
+
+#include <map>
+#include <string>
+#include <vector>
+
+/// Modal participation factors, one per direction X, Y, Z, RX, RY, RZ.
+struct T_MPAF_D {
+    T_DOF6 factor{};
+};
+/// Effective modal masses in per cent of the direction's total.
+struct T_MPAM_D {
+    T_DOF6 percent{};
+};
+
+/// Limit-state steps of the pushover load cases, kept with the model.
+class CPoverInfo {
+public:
+    explicit CPoverInfo(CDataCtrl& data) : m_data(data) {}
+
+    /// Steps of the Eurocode 8 limit states; -2 stands for not found.
+    void SetStepEC8(int loadCase, int stepDL, int stepSD, int stepNC);
+    /// Steps of the NTC limit states, for the 2008 and the 2018 code. SLO is not stored, on
+    /// purpose.
+    void SetStepNTC2008(int loadCase, int stepSLD, int stepSLV, int stepSLC);
+    /// 1 stored steps exist; 0 none, outputs as they were.
+    [[nodiscard]] int GetStepEC8(int loadCase, std::array<int, 3>& out) const;
+    [[nodiscard]] int GetStepNTC2008(int loadCase, std::array<int, 3>& out) const;
+
+private:
+    CDataCtrl& m_data;
+};
+
+class CPostCtrl {
+public:
+    explicit CPostCtrl(CDataCtrl& data) : m_data(data), m_poverInfo(data) {}
+
+    CPoverInfo* GetPoverInfo() { return &m_poverInfo; }
+
+    /// Number of eigen modes; modes count from 1.
+    int GetNumEigvPost() const;
+    /// Selects the mode that GetEiMode reads. 1 done; 0 there is no such mode.
+    [[nodiscard]] int SelectMode(int mode);
+    /// Shape components of a node in the selected mode; all 0 for a node outside the shape.
+    void GetEiMode(int node, T_DOF6& out) const;
+    /// Participation factors and effective masses of a mode as recorded, else from the nodal
+    /// masses and the shape (factor = L / M; percent = 100 L2 / (M total)). 1 done; 0 no such mode.
+    [[nodiscard]] int GetEiMpafNeutral(int mode, T_MPAF_D& out) const;
+    [[nodiscard]] int GetEiMpam(int mode, T_MPAM_D& out) const;
+
+    /// Selects the pushover load case whose steps are read. 1 done; 0 it has no results.
+    [[nodiscard]] int SelectPushover(int loadCase);
+    int GetStepCount() const;
+    /// Steps count from 1. 1 done; 0 out of range.
+    [[nodiscard]] int SelectStep(int step);
+    /// Values of the selected step in the control direction. 1 done; 0 not there or not readable
+    /// (Error says why), output as it was.
+    [[nodiscard]] int GetStepFactor_PO(double& factor);
+    [[nodiscard]] int GetReacNew(double& reaction);
+    [[nodiscard]] int GetDispNew(int node, double& displacement);
+    bool ExistNodePost(int node) const;
+    std::string Error() const { return m_error; }
+
+    /// Storey drift ratios of a step, largest over the storeys: kind 1 by the storey's vertical
+    /// node pairs (for curve data the mean over the storey's nodes), kind 2 at the storey's centre
+    /// of mass. Storey drift = |u(i) - u(i-1)| / h(i), the ground being at rest. Nodes without
+    /// results do not count. 1 done; 0 no storeys or no results, outputs as they were.
+    [[nodiscard]] int GetPushoverStoryDriftRatio(int loadCase, int step, double& kind1,
+                                                 double& kind2);
+
+private:
+    struct T_SERIES {
+        std::vector<double> values; // current units, one per step
+    };
+    int ReadSeries(int node, const std::vector<double>*& out);
+    int ReadCurve();
+    double StoreyMean(const T_STOR_D& storey, std::size_t step, bool byMass, int direction);
+    void DeriveParticipation(const T_EIGV_D& mode, T_MPAF_D& factor, T_MPAM_D& percent) const;
+    IPushResult* Source() const;
+    int Direction() const; // 0 to 5
+    T_DIM DispDim() const;
+    T_DIM ReacDim() const;
+
+    CDataCtrl& m_data;
+    CPoverInfo m_poverInfo;
+    int m_mode = 0;
+    int m_pushover = 0;
+    int m_step = 0;
+    long m_revision = -1; // revision of the data that the caches belong to
+    std::vector<double> m_factors, m_reactions;
+    std::map<int, std::vector<double>> m_series;
+    std::string m_error;
+};

@@ -1,0 +1,302 @@
+#include "qm_db/recordcodec.h"
+
+#include "qm_db/checksum.h"
+#include "qm_db/recordcodecfields.h"
+#include "qm_db/storefault.h"
+
+#include <algorithm>
+#include <cstring>
+
+namespace {
+
+constexpr std::size_t kChunkNodes = 512; // nodes that are packed together
+constexpr const char* kNodes = "nodes";  // owner of their arrays; the key is the chunk
+
+// One Fields() per record: each names its columns once, for writing and for reading.
+
+template <class V>
+void Fields(V& v, typename V::template Ref<T_STYP_D> r)
+{
+    v("title", r.title);
+    v("force_unit", r.units.force);
+    v("length_unit", r.units.length);
+    v("gravity", r.gravity);
+}
+
+template <class V>
+void Fields(V& v, typename V::template Ref<T_STOR_D> r)
+{
+    v("name", r.name);
+    v("height", r.height);
+    v.Array("nodes", r.nodes);
+}
+
+template <class V>
+void Fields(V& v, typename V::template Ref<T_SPFC_ATC40> r)
+{
+    v("Ca", r.Ca);
+    v("Cv", r.Cv);
+    v("floors", r.floors);
+}
+
+template <class V>
+void Fields(V& v, typename V::template Ref<T_SPFC_EURO2003> r)
+{
+    v("type", r.type);
+    v("soil", r.soil);
+    v("ag", r.ag);
+    v("damping", r.damping);
+    v("S", r.S);
+    v("TB", r.TB);
+    v("TC", r.TC);
+    v("TD", r.TD);
+}
+
+template <class V>
+void Fields(V& v, typename V::template Ref<T_SPFC_EURO1996> r)
+{
+    v("soil", r.soil);
+    v("ag", r.ag);
+    v("damping", r.damping);
+}
+
+template <class V>
+void Fields(V& v, typename V::template Ref<T_SPFC_NTC> r)
+{
+    v("soil", r.soil);
+    v("topography", r.topography);
+    v("damping", r.damping);
+    for (std::size_t i = 0; i < r.states.size(); ++i) {
+        const std::string state = kLimitStateNames[i];
+        if (!v.Part(state + "_ag", r.states[i])) continue;
+        v(state + "_ag", r.states[i]->ag);
+        v(state + "_F0", r.states[i]->F0);
+        v(state + "_TCstar", r.states[i]->TCstar);
+    }
+}
+
+template <class V>
+void Fields(V& v, typename V::template Ref<T_SPFC_USER> r)
+{
+    v.Array("T", r.T);
+    v.Array("Sa", r.Sa);
+    v("gravity", r.gravity);
+}
+
+template <class V>
+void Fields(V& v, typename V::template Ref<T_SPFC_D> r)
+{
+    v("name", r.name);
+    v.Kind(r);
+    std::visit([&](auto& data) { Fields(v, data); }, r.data);
+}
+
+template <class V>
+void Fields(V& v, typename V::template Ref<T_POLC_D> r)
+{
+    v("name", r.name);
+    v("control_node", r.controlNode);
+    v("direction", r.direction);
+    v("pattern_kind", r.patternKind);
+    v.Array("modes", r.modes);
+}
+
+template <class V>
+void Fields(V& v, typename V::template Ref<T_EVAL_BILINEAR> r)
+{
+    v("bilinear_rule", r.rule);
+    v("bilinear_secant", r.secant);
+    v("bilinear_drop", r.drop);
+    v("bilinear_iterate", r.iterate);
+}
+
+template <class V>
+void Fields(V& v, typename V::template Ref<T_EVAL_D> r)
+{
+    v("name", r.name);
+    v("push", r.push);
+    v("method", r.method);
+    v("procedure", r.procedure);
+    v("spectrum", r.spectrum);
+    v("behavior", r.behavior);
+    v("elastic_damping", r.elasticDamping);
+    v.Array("user_damping", r.userDamping);
+    v("eigen_factors", r.eigenFactors);
+    v("masonry", r.masonry);
+    v("drift_kind", r.driftKind);
+    v("plot_type", r.plotType);
+    v("alpha_in_percent", r.alphaInPercent);
+    v.Flag("has_bilinear", r.bilinear);
+    if (r.bilinear) Fields(v, *r.bilinear);
+}
+
+template <class V>
+void Fields(V& v, typename V::template Ref<T_POVR_D> r)
+{
+    v.Array("ec8", r.ec8);
+    v.Array("ntc", r.ntc);
+}
+
+/// A mode's shape is two arrays: node ids, and six components per node.
+void PutShape(const T_EIGV_D& mode, std::int64_t key, CPackedArrays& arrays)
+{
+    std::vector<int> nodes;
+    std::vector<double> shape;
+    for (const auto& [node, components] : mode.shape) {
+        nodes.push_back(node);
+        shape.insert(shape.end(), components.begin(), components.end());
+    }
+    arrays.Put("modes", key, "shape_nodes", nodes);
+    arrays.Put("modes", key, "shape", shape);
+}
+
+void GetShape(T_EIGV_D& mode, const CRecordRow& row, const CPackedArrays& arrays)
+{
+    const std::vector<int> nodes = arrays.Ints("modes", row.Key(), "shape_nodes");
+    const std::vector<double> shape = arrays.Doubles("modes", row.Key(), "shape");
+    if (shape.size() != nodes.size() * std::tuple_size_v<T_DOF6>) row.ThrowBadCell("shape");
+    auto from = shape.begin();
+    for (const int node : nodes) {
+        T_DOF6& components = mode.shape.emplace_hint(mode.shape.end(), node, T_DOF6{})->second;
+        std::copy_n(from, components.size(), components.begin());
+        from += static_cast<std::ptrdiff_t>(components.size());
+    }
+}
+
+void Fields(CFieldPut& v, const T_EIGV_D& r)
+{
+    v("period", r.period);
+    v.Array("participation", r.participation);
+    v.Array("mass_percent", r.massPercent);
+    PutShape(r, v.Row().Key(), v.Arrays());
+}
+
+void Fields(CFieldGet& v, T_EIGV_D& r)
+{
+    v("period", r.period);
+    v.Array("participation", r.participation);
+    v.Array("mass_percent", r.massPercent);
+    GetShape(r, v.Row(), v.Arrays());
+}
+
+template <class R>
+void WriteRecord(const CSqliteDb& db, const char* table, int key, const R& record,
+                 CPackedArrays& arrays)
+{
+    CRecordRow row(table, key);
+    CFieldPut put(row, arrays);
+    Fields(put, record);
+    row.Insert(db);
+}
+
+template <class R>
+void WriteTable(const CSqliteDb& db, const char* table, const T_TABLE<R>& records,
+                CPackedArrays& arrays)
+{
+    for (const auto& [key, record] : records)
+        WriteRecord(db, table, key, record, arrays);
+}
+
+template <class R>
+T_TABLE<R> ReadTable(const CSqliteDb& db, const char* table, const CPackedArrays& arrays,
+                     T_TABLE_SUMS& sums)
+{
+    T_TABLE<R> records;
+    CChecksum sum;
+    for (const CRecordRow& row : CRecordRow::ReadAll(db, table, sum)) {
+        const auto key = static_cast<int>(row.Key());
+        if (key != row.Key()) row.ThrowBadCell("key");
+        CFieldGet get(row, arrays);
+        Fields(get, records[key]);
+    }
+    sums[table] = sum.Value();
+    return records;
+}
+
+void PutNodes(const T_TABLE<T_NODE_D>& nodes, CPackedArrays& arrays)
+{
+    auto node = nodes.begin();
+    for (std::int64_t chunk = 0; node != nodes.end(); ++chunk) {
+        std::vector<int> ids, restraint;
+        std::vector<double> xyz, mass;
+        for (; node != nodes.end() && ids.size() < kChunkNodes; ++node) {
+            const T_NODE_D& n = node->second;
+            ids.push_back(n.id);
+            xyz.insert(xyz.end(), n.xyz.begin(), n.xyz.end());
+            mass.insert(mass.end(), n.mass.begin(), n.mass.end());
+            restraint.insert(restraint.end(), n.restraint.begin(), n.restraint.end());
+        }
+        arrays.Put(kNodes, chunk, "id", ids);
+        arrays.Put(kNodes, chunk, "xyz", xyz);
+        arrays.Put(kNodes, chunk, "mass", mass);
+        // Most nodes have no restraint: a chunk without any has no array of them.
+        if (std::any_of(restraint.begin(), restraint.end(), [](int flag) { return flag != 0; }))
+            arrays.Put(kNodes, chunk, "restraint", restraint);
+    }
+}
+
+/// Takes the n-th group of as many packed numbers as `to` has.
+template <class T, std::size_t N>
+void TakeGroup(std::span<const std::byte> from, std::size_t n, std::array<T, N>& to)
+{
+    std::memcpy(to.data(), from.data() + n * sizeof to, sizeof to);
+}
+
+void GetNodeChunk(const CPackedArrays& arrays, std::int64_t chunk, T_TABLE<T_NODE_D>& nodes)
+{
+    if (static_cast<std::size_t>(chunk) * kChunkNodes != nodes.size())
+        ThrowDamaged(kNodes + (' ' + std::to_string(chunk)));
+    const std::vector<int> ids = arrays.Ints(kNodes, chunk, "id");
+    const auto xyz = arrays.Bytes(kNodes, chunk, "xyz", 'f');
+    const auto mass = arrays.Bytes(kNodes, chunk, "mass", 'f');
+    const auto restraint = arrays.Bytes(kNodes, chunk, "restraint", 'i');
+    if (xyz.size() != ids.size() * sizeof(T_NODE_D::xyz) ||
+        mass.size() != ids.size() * sizeof(T_NODE_D::mass) ||
+        (!restraint.empty() && restraint.size() != ids.size() * sizeof(T_NODE_D::restraint)))
+        ThrowDamaged(kNodes + (' ' + std::to_string(chunk)));
+    for (std::size_t i = 0; i < ids.size(); ++i) {
+        T_NODE_D& node = nodes.try_emplace(nodes.end(), ids[i])->second;
+        node.id = ids[i];
+        TakeGroup(xyz, i, node.xyz);
+        TakeGroup(mass, i, node.mass);
+        if (!restraint.empty()) TakeGroup(restraint, i, node.restraint);
+    }
+}
+
+} // namespace
+
+void WriteModel(const CSqliteDb& db, const T_MODEL& model)
+{
+    CPackedArrays arrays;
+    PutNodes(model.nodes, arrays);
+    WriteRecord(db, "model", 1, model.styp, arrays);
+    WriteTable(db, "storeys", model.storeys, arrays);
+    WriteTable(db, "modes", model.modes, arrays);
+    WriteTable(db, "spectra", model.spectra, arrays);
+    WriteTable(db, "pushovers", model.pushovers, arrays);
+    WriteTable(db, "evaluations", model.evaluations, arrays);
+    WriteTable(db, "limit_state_steps", model.poverSteps, arrays);
+    arrays.Write(db);
+}
+
+T_MODEL ReadModel(const CSqliteDb& db, T_TABLE_SUMS& sums)
+{
+    T_MODEL model;
+    CChecksum arraySum;
+    const CPackedArrays arrays = CPackedArrays::Read(
+        db, arraySum, kNodes, [&](const CPackedArrays& some, std::int64_t chunk) {
+            GetNodeChunk(some, chunk, model.nodes);
+        });
+    sums["arrays"] = arraySum.Value();
+
+    const T_TABLE<T_STYP_D> styp = ReadTable<T_STYP_D>(db, "model", arrays, sums);
+    if (styp.size() != 1 || styp.begin()->first != 1) ThrowDamaged("model");
+    model.styp = styp.begin()->second;
+    model.storeys = ReadTable<T_STOR_D>(db, "storeys", arrays, sums);
+    model.modes = ReadTable<T_EIGV_D>(db, "modes", arrays, sums);
+    model.spectra = ReadTable<T_SPFC_D>(db, "spectra", arrays, sums);
+    model.pushovers = ReadTable<T_POLC_D>(db, "pushovers", arrays, sums);
+    model.evaluations = ReadTable<T_EVAL_D>(db, "evaluations", arrays, sums);
+    model.poverSteps = ReadTable<T_POVR_D>(db, "limit_state_steps", arrays, sums);
+    return model;
+}

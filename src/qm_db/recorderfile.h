@@ -1,0 +1,44 @@
+// A raw table of another solver: rows of numbers separated by blanks, tabs or commas, with or
+// without one header line. Lines that start with '#' and blank lines don't count as rows.
+#pragma once
+
+#include "qm_db/fileerror.h"
+
+#include <map>
+#include <string>
+#include <string_view>
+#include <vector>
+
+class CRecorderFile {
+public:
+    /// Reads folder/path. The first `skipRows` lines are dropped, whatever they hold; a first row
+    /// without any number is the header. 1 done; 0 error filled (names `path`), nothing loaded.
+    [[nodiscard]] int Load(const std::string& folder, const std::string& path, int skipRows,
+                           T_FILE_ERROR& error);
+    /// The same from text; `name` stands for the file in messages.
+    void Parse(std::string_view text, const std::string& name, int skipRows);
+
+    bool IsLoaded() const { return m_loaded; }
+    std::size_t RowCount() const { return m_rowStart.size(); }
+    /// Line of the last row, from 1; 0 without rows.
+    int LastLine() const { return m_rowLine.empty() ? 0 : m_rowLine.back(); }
+
+    /// Column (from 1) by its name in the header. 1 done; 0 error filled.
+    [[nodiscard]] int FindColumn(const std::string& name, int& column, T_FILE_ERROR& error) const;
+    /// Adds a column (from 1) to `sum`, which has RowCount() values. 1 done; 0 a row has no such
+    /// column or no finite number there: error filled with file, line and column, `sum` as it was.
+    [[nodiscard]] int AddColumn(int column, std::vector<double>& sum, T_FILE_ERROR& error) const;
+
+private:
+    void AddRow(const std::vector<std::string_view>& cells, int line);
+    std::size_t CellCount(std::size_t row) const;
+    T_FILE_ERROR ErrorAt(std::size_t row, std::size_t column, const std::string& reason) const;
+
+    bool m_loaded = false;
+    std::string m_name;
+    std::vector<std::string> m_header;
+    std::vector<double> m_cells;         // row after row; NaN marks a cell that is no number
+    std::vector<std::size_t> m_rowStart; // index of the row's first cell in m_cells
+    std::vector<int> m_rowLine;          // line of the row in the file, from 1
+    std::map<std::size_t, std::string> m_badCells; // column (from 0): first text that is no number
+};

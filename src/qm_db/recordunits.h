@@ -1,0 +1,63 @@
+// Which fields of a record are quantities, and of which dimension: one place for every converter.
+// ForEachQuantity(record, f) calls f(double& value, T_DIM) for each of them.
+#pragma once
+
+#include "qm_db/records.h"
+
+template <class F>
+void ForEachQuantity(T_STYP_D& r, F&& f)
+{
+    if (r.gravity) f(*r.gravity, kDimAccel);
+}
+
+template <class F>
+void ForEachQuantity(T_NODE_D& r, F&& f)
+{
+    for (double& v : r.xyz)
+        f(v, kDimLength);
+    for (double& v : r.mass)
+        f(v, kDimMass);
+}
+
+template <class F>
+void ForEachQuantity(T_STOR_D& r, F&& f)
+{
+    f(r.height, kDimLength);
+}
+
+template <class F>
+void ForEachQuantity(T_SPFC_D& r, F&& f)
+{
+    if (auto* user = std::get_if<T_SPFC_USER>(&r.data); user && user->gravity)
+        f(*user->gravity, kDimAccel);
+}
+
+// Mode shapes are in the normalisation of their source; evaluations and load cases hold no lengths.
+template <class F>
+void ForEachQuantity(T_EIGV_D&, F&&)
+{
+}
+template <class F>
+void ForEachQuantity(T_POLC_D&, F&&)
+{
+}
+template <class F>
+void ForEachQuantity(T_EVAL_D&, F&&)
+{
+}
+template <class F>
+void ForEachQuantity(T_POVR_D&, F&&)
+{
+}
+
+/// Converts every quantity of a record between the given units and SI, in place.
+template <class T>
+void RecordToSi(T& r, const T_UNITS& units)
+{
+    ForEachQuantity(r, [&](double& v, T_DIM d) { v = ToSi(v, units, d); });
+}
+template <class T>
+void RecordFromSi(T& r, const T_UNITS& units)
+{
+    ForEachQuantity(r, [&](double& v, T_DIM d) { v = FromSi(v, units, d); });
+}

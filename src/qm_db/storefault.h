@@ -1,0 +1,32 @@
+// What the parts of the model store throw at each other; CModelStore turns it into a T_FILE_ERROR.
+#pragma once
+
+#include "qm_db/fileerror.h"
+
+#include <exception>
+#include <string>
+#include <utility>
+
+/// A refusal: message key, whose {1} is the file's name and whose {2} to {4} are details.
+class CStoreFault : public std::exception {
+public:
+    CStoreFault(FILE_FAULT fault, const char* key, std::string second = {}, std::string third = {},
+                std::string fourth = {})
+        : m_fault(fault), m_key(key), m_second(std::move(second)), m_third(std::move(third)),
+          m_fourth(std::move(fourth))
+    {
+    }
+    const char* what() const noexcept override { return m_key; }
+    /// The whole message, one line.
+    T_FILE_ERROR ForFile(const std::string& path) const;
+
+private:
+    FILE_FAULT m_fault;
+    const char* m_key; // a literal
+    std::string m_second, m_third, m_fourth;
+};
+
+/// BadInput: "<file> is damaged: <what>".
+[[noreturn]] void ThrowDamaged(const std::string& what);
+/// NoAccess with the text of the system's error number as the detail.
+[[noreturn]] void ThrowSystem(const char* key, int errorNumber);

@@ -1,0 +1,65 @@
+#include "qm_db/undoctrl.h"
+
+#include <ranges>
+#include <type_traits>
+
+namespace {
+
+constexpr std::size_t kMaxSteps = 200;
+
+template <class T>
+void ApplyOne(T_MODEL& model, int key, const std::optional<T>& value)
+{
+    if constexpr (std::is_same_v<T, T_STYP_D>) {
+        if (value) model.styp = *value;
+    } else if (value) {
+        TableOf<T>(model).insert_or_assign(key, *value);
+    } else {
+        TableOf<T>(model).erase(key);
+    }
+}
+
+} // namespace
+
+void CUndoCtrl::Apply(T_MODEL& model, const T_CHANGE_ANY& change, bool forward)
+{
+    std::visit([&](const auto& c) { ApplyOne(model, c.key, forward ? c.after : c.before); },
+               change);
+}
+
+int CUndoCtrl::Undo()
+{
+    if (m_done.empty()) return 0;
+    T_UNDO_STEP step = std::move(m_done.back());
+    m_done.pop_back();
+    T_MODEL& model = m_data.ModelForEdit();
+    for (const T_CHANGE_ANY& change : step.changes | std::views::reverse)
+        Apply(model, change, false);
+    m_undone.push_back(std::move(step));
+    return 1;
+}
+
+int CUndoCtrl::Redo()
+{
+    if (m_undone.empty()) return 0;
+    T_UNDO_STEP step = std::move(m_undone.back());
+    m_undone.pop_back();
+    T_MODEL& model = m_data.ModelForEdit();
+    for (const T_CHANGE_ANY& change : step.changes)
+        Apply(model, change, true);
+    m_done.push_back(std::move(step));
+    return 1;
+}
+
+void CUndoCtrl::Push(T_UNDO_STEP step)
+{
+    m_undone.clear();
+    if (m_done.size() == kMaxSteps) m_done.erase(m_done.begin());
+    m_done.push_back(std::move(step));
+}
+
+void CUndoCtrl::Clear()
+{
+    m_done.clear();
+    m_undone.clear();
+}

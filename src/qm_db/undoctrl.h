@@ -1,0 +1,52 @@
+// Undo and redo of committed edits. A step holds the records before and after, nothing else.
+#pragma once
+
+#include "qm_db/datactrl.h"
+
+#include <optional>
+#include <string>
+#include <variant>
+#include <vector>
+
+/// One record before and after; absent means that it did not exist.
+template <class T>
+struct T_CHANGE {
+    int key = 0;
+    std::optional<T> before;
+    std::optional<T> after;
+};
+
+using T_CHANGE_ANY =
+    std::variant<T_CHANGE<T_STYP_D>, T_CHANGE<T_NODE_D>, T_CHANGE<T_STOR_D>, T_CHANGE<T_EIGV_D>,
+                 T_CHANGE<T_SPFC_D>, T_CHANGE<T_POLC_D>, T_CHANGE<T_EVAL_D>>;
+
+/// What one command of the user changed.
+struct T_UNDO_STEP {
+    std::string title;
+    std::vector<T_CHANGE_ANY> changes;
+};
+
+class CUndoCtrl {
+public:
+    explicit CUndoCtrl(CDataCtrl& data) : m_data(data) {}
+
+    bool CanUndo() const { return !m_done.empty(); }
+    bool CanRedo() const { return !m_undone.empty(); }
+    std::string UndoTitle() const { return CanUndo() ? m_done.back().title : std::string(); }
+
+    /// Takes back the latest step, or applies it again. 1 done; 0 there is none.
+    [[nodiscard]] int Undo();
+    [[nodiscard]] int Redo();
+
+    /// For CEditData: keeps a committed step (at most 200) and forgets what was undone.
+    void Push(T_UNDO_STEP step);
+    void Clear();
+
+    /// Applies a change forwards or backwards to the model.
+    static void Apply(T_MODEL& model, const T_CHANGE_ANY& change, bool forward);
+
+private:
+    CDataCtrl& m_data;
+    std::vector<T_UNDO_STEP> m_done;
+    std::vector<T_UNDO_STEP> m_undone;
+};

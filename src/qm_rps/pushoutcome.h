@@ -1,0 +1,46 @@
+// Named outcomes of an evaluation: what happened, beside the return code.
+#pragma once
+
+#include <string>
+
+enum class PUSH_OUTCOME {
+    None,
+    Converged,
+    Elastic,
+    NoCrossing,
+    Trials1500,
+    CapacityEnds,
+    NoTrialPoint,
+    Cycles,
+    BilinearFailed,
+    DampingFailed,
+    ZeroTrial,
+    NoLocusCrossing,
+    PeriodUndefined,
+    NoCapacity,
+    ConversionFailed,
+    NoEigen,
+    EigenError,
+    DuctilityBelow1,
+    CoefficientsFailed,
+    NoPeriodCrossing,
+    CurveTooShort,
+    NotComputed,
+    TargetFound,
+    NoTarget,
+    BilinearTooShort,
+    ZeroDemand,
+    TargetBeyond
+};
+
+/// An outcome with its number, where it has one (trials of a cycle).
+struct T_OUTCOME {
+    PUSH_OUTCOME code = PUSH_OUTCOME::None;
+    int count = 0;
+    bool operator==(const T_OUTCOME&) const = default;
+};
+
+/// Short name, always in English ("converged", "cycles between 2 trials").
+std::string OutcomeName(const T_OUTCOME& outcome);
+/// One sentence on what to look at, in the chosen language.
+std::string OutcomeAdvice(const T_OUTCOME& outcome);

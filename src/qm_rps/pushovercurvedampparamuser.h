@@ -1,0 +1,19 @@
+// Model of the dialog for user-defined damping modification: kappa over hysteretic damping.
+#pragma once
+
+#include "qm_base/mdialog.h"
+#include "qm_rps/pushoverperfptrecord.h"
+
+class CPushOverCurveDampParamUser : public zql::frx::MDialog {
+public:
+    /// Fields in their order on the dialog: damping in per cent, factors without unit.
+    double m_beta1 = 0.0, m_kappa1 = 0.0, m_beta2 = 0.0, m_kappa2 = 0.0;
+
+    void Data2Dlg(const T_DAMP_PARAM& damping);
+    /// Writes the four values into the settings.
+    void Dlg2Data(T_DAMP_PARAM& damping) const;
+
+    /// beta1 <= beta2, both above 0 and all finite; the kappa values are as the engineer wants
+    /// them. 0 shows IDS_PUSHOVER_Wrong_Input_ and the dialog stays open.
+    int CheckData() override;
+};

@@ -1,0 +1,79 @@
+// Model behind the pushover curve window: assembles the capacity curve of one pushover load case,
+// runs the chosen method, stores the limit-state steps in the model, hands out the result.
+//
+// One evaluation is: SetEvaluation, Evaluate, Result. Nothing is shown but through messages.
+#pragma once
+
+#include "qm_rps/pushevaluation.h"
+#include "qm_rps/pushovercalcperfptbase.h"
+#include "qm_rps/pushovertargetevaluation.h"
+
+#include <memory>
+
+/// The calculator of a performance-point method by the driver's procedure number: ATC-40 0 A, 1 B;
+/// FEMA 440 0 A, 1 B (MADRS), 2 C. Null, and the release assertion, for any other number.
+std::unique_ptr<CPushOverCalcPerfPtBase> MakePerfPtCalculator(PUSH_METHOD method, int procedure,
+                                                              CPushOverPerfPtRecord& owner);
+
+class CPushOverCurveDlg : public zql::frx::MDialog, public CPushOverPerfPtRecord {
+public:
+    /// The document is not owned and must outlive the dialog.
+    explicit CPushOverCurveDlg(CDBDoc& doc);
+
+    /// Takes the settings of an evaluation. 1 taken; 0 its load case or spectrum does not exist
+    /// (SettingsError names it) or an option is out of range, settings as they were.
+    [[nodiscard]] int SetEvaluation(const T_EVAL_D& evaluation);
+    const std::string& SettingsError() const { return m_settingsError; }
+
+    /// Runs the evaluation. 0 no point or target, 1 found, 2 found and elastic; Result is filled
+    /// in every case.
+    int Evaluate();
+    const T_PUSH_EVALUATION& Result() const { return m_result; }
+
+    /// Whether limit-state steps are stored in the model (the default).
+    void SetStoreSteps(bool store) { m_storeSteps = store; }
+
+    /// Reads the result steps and builds the capacity spectrum. 1 done; 0 the outcome says why.
+    [[nodiscard]] int CalcPushoverCurve();
+
+    /// SDOF to MDOF; null arguments are left out. See CPushOverCurveData.
+    void TransferToDispAndReac(double* displacement, double* reaction) const
+    {
+        m_curve.TransferToDispAndReac(displacement, reaction);
+    }
+
+    /// Gravity in current units: of the user spectrum where it states one and `fromSpectrum` is
+    /// set, else of the model, else 9.80665 m/s2.
+    double GetGravity(int fromSpectrum) const;
+
+    /// The cells of the performance point: "%6.4g,  %6.4g", "Elastic(...)" for an elastic point.
+    std::string PerfPointCell() const;
+
+    /// Obsolete; asserts and returns 0, on purpose.
+    int ExistEC8() const;
+
+private:
+    int UpdatePerformancePoint();
+    int UpdateTargetDispData();
+    T_TARGET_INPUT TargetInput();
+    T_BILINEAR_OPTIONS BilinearOptions() const;
+    std::optional<double> DriftOfStep(int step);
+    void StoreSteps(const CPushOverTargetEvaluation& evaluation);
+    void KeepPoint(double Dp, double Ap, std::optional<double> beta);
+    int CheckCurve();
+    void WarnAboutCurve();
+    void FillResult();
+    void PlotCurve();
+    int Fail(PUSH_OUTCOME code, const char* key);
+    PLOT_TYPE MethodPlotType() const { return static_cast<PLOT_TYPE>(m_eval.method); }
+
+    CDBDoc& m_doc;
+    T_EVAL_D m_eval;
+    T_SPFC_D m_spectrumRecord;
+    int m_pushover = 0;
+    bool m_storeSteps = true;
+    bool m_driftMissing = false;
+    CPushOverCurveData m_curve;
+    T_PUSH_EVALUATION m_result;
+    std::string m_settingsError;
+};

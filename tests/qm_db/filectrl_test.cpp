@@ -1,0 +1,137 @@
+#include "qm_db/filectrl.h"
+
+#include <filesystem>
+#include <fstream>
+#include <gtest/gtest.h>
+#include <sys/resource.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+namespace fs = std::filesystem;
+
+namespace {
+
+/// A folder of its own per test, removed at the end.
+class FileCtrl : public testing::Test {
+protected:
+    FileCtrl()
+        : m_folder(testing::TempDir() + "filectrl_test_" + std::to_string(getpid()) + "/"),
+          m_path(m_folder + "frame.json")
+    {
+        fs::create_directory(m_folder);
+    }
+    ~FileCtrl() override { fs::remove_all(m_folder); }
+
+    std::size_t FileCount() const
+    {
+        return static_cast<std::size_t>(
+            std::distance(fs::directory_iterator(m_folder), fs::directory_iterator()));
+    }
+    static std::string TextOf(const std::string& path)
+    {
+        std::ifstream in(path, std::ios::binary);
+        return {std::istreambuf_iterator<char>(in), {}};
+    }
+
+    std::string m_folder;
+    std::string m_path;
+    T_FILE_ERROR m_error;
+};
+
+/// Lowers the limit of the size of files while it lives.
+class CSizeLimit {
+public:
+    explicit CSizeLimit(rlim_t bytes)
+    {
+        getrlimit(RLIMIT_FSIZE, &m_before);
+        const rlimit limit{bytes, m_before.rlim_max};
+        setrlimit(RLIMIT_FSIZE, &limit);
+    }
+    ~CSizeLimit() { setrlimit(RLIMIT_FSIZE, &m_before); }
+
+private:
+    rlimit m_before{};
+};
+
+TEST_F(FileCtrl, DropsTheLastExtensionOnly)
+{
+    const char* const rows[][2] = {
+        {"/a/b/frame.v2.qmdb", "/a/b/frame.v2"},
+        {"frame.json", "frame"},
+        {"/a.b/frame", "/a.b/frame"},
+        {"/a/.hidden", "/a/.hidden"},
+        {"", ""},
+    };
+    for (const auto& row : rows)
+        EXPECT_EQ(row[1], CFileCtrl::GetFilePathAndNameWithoutExtension(row[0]));
+}
+
+TEST_F(FileCtrl, WritesReplacesAndReadsBack)
+{
+    const std::string big(3'000'001, 'x');
+    const std::string odd("line\r\n\0\xff", 8);
+    std::string text;
+    for (const std::string& whole : {big, std::string(), odd}) {
+        ASSERT_EQ(1, CFileCtrl::WriteWholeFile(m_path, whole, m_error)) << m_error.text;
+        ASSERT_EQ(1, CFileCtrl::ReadWholeFile(m_path, text, m_error)) << m_error.text;
+        EXPECT_EQ(whole, text);
+    }
+    EXPECT_EQ(1U, FileCount()); // no temporary file
+}
+
+TEST_F(FileCtrl, ReadsAFileThatTellsNoSize)
+{
+    std::string text;
+    ASSERT_EQ(1, CFileCtrl::ReadWholeFile("/proc/self/stat", text, m_error)) << m_error.text;
+    EXPECT_EQ(0U, text.find(std::to_string(getpid())));
+}
+
+TEST_F(FileCtrl, KeepsTheOldFileWhenTheDiskIsFull)
+{
+    ASSERT_EQ(1, CFileCtrl::WriteWholeFile(m_path, "old", m_error));
+    {
+        const CSizeLimit limit(1000); // the process would die of SIGXFSZ without care
+        EXPECT_EQ(0, CFileCtrl::WriteWholeFile(m_path, std::string(5000, 'n'), m_error));
+    }
+    EXPECT_EQ(FILE_FAULT::NoAccess, m_error.fault);
+    EXPECT_EQ(0U, m_error.text.find(m_path + ": can't write: ")) << m_error.text;
+    EXPECT_EQ("old", TextOf(m_path));
+    EXPECT_EQ(1U, FileCount());
+    EXPECT_EQ(0, CFileCtrl::WriteWholeFile("/dev/full", "n", m_error));
+    EXPECT_EQ(FILE_FAULT::NoAccess, m_error.fault);
+}
+
+TEST_F(FileCtrl, KeepsLinkAndPermissions)
+{
+    const std::string link = m_folder + "link.json";
+    ASSERT_EQ(1, CFileCtrl::WriteWholeFile(m_path, "old", m_error));
+    fs::permissions(m_path, fs::perms(0640));
+    fs::create_symlink("frame.json", link);
+    ASSERT_EQ(1, CFileCtrl::WriteWholeFile(link, "new", m_error)) << m_error.text;
+    EXPECT_TRUE(fs::is_symlink(link));
+    EXPECT_EQ("new", TextOf(m_path));
+    EXPECT_EQ(fs::perms(0640), fs::status(m_path).permissions());
+}
+
+TEST_F(FileCtrl, TakesOverATemporaryFileOfADeadProcess)
+{
+    std::ofstream(m_path + ".tmp-" + std::to_string(getpid())) << "half";
+    ASSERT_EQ(1, CFileCtrl::WriteWholeFile(m_path, "new", m_error)) << m_error.text;
+    EXPECT_EQ("new", TextOf(m_path));
+    EXPECT_EQ(1U, FileCount());
+}
+
+TEST_F(FileCtrl, RefusesWhatIsNoFile)
+{
+    std::string text = "as it was";
+    EXPECT_EQ(0, CFileCtrl::ReadWholeFile(m_folder, text, m_error));
+    EXPECT_EQ(FILE_FAULT::NoAccess, m_error.fault);
+    EXPECT_EQ(0, CFileCtrl::ReadWholeFile(m_path, text, m_error));
+    EXPECT_EQ(m_path + ": can't open: No such file or directory", m_error.text);
+    EXPECT_EQ("as it was", text);
+    EXPECT_EQ(0, CFileCtrl::WriteWholeFile(m_folder, "x", m_error));
+    EXPECT_EQ(0, CFileCtrl::WriteWholeFile(m_folder + "none/x", "x", m_error));
+    EXPECT_EQ(0U, FileCount());
+}
+
+} // namespace
