@@ -2,6 +2,7 @@
 
 #include "qm_base/textformat.h"
 
+#include <atomic>
 #include <cstdarg>
 #include <cstdio>
 #include <cstdlib>
@@ -13,6 +14,7 @@ namespace {
 using Sink = std::function<void(std::string_view)>;
 
 struct T_TRACE {
+    std::atomic<bool> installed = false; // a sink is there: spares the lock where there is none
     std::mutex guard;
     std::shared_ptr<const Sink> sink; // null: default
 };
@@ -26,6 +28,7 @@ T_TRACE& Trace()
 std::shared_ptr<const Sink> InstalledSink()
 {
     T_TRACE& trace = Trace();
+    if (!trace.installed) return nullptr;
     const std::lock_guard lock(trace.guard);
     return trace.sink;
 }
@@ -62,4 +65,5 @@ void SetDebugSink(std::function<void(std::string_view)> sink)
     T_TRACE& trace = Trace();
     const std::lock_guard lock(trace.guard);
     trace.sink.swap(next);
+    trace.installed = trace.sink != nullptr;
 }

@@ -15,12 +15,12 @@
 namespace {
 
 /// An open file that is closed at the end of its scope.
-class CFileHandle {
+class CScopedDescriptor {
 public:
-    explicit CFileHandle(int fd) : m_fd(fd) {}
-    CFileHandle(const CFileHandle&) = delete;
-    CFileHandle& operator=(const CFileHandle&) = delete;
-    ~CFileHandle()
+    explicit CScopedDescriptor(int fd) : m_fd(fd) {}
+    CScopedDescriptor(const CScopedDescriptor&) = delete;
+    CScopedDescriptor& operator=(const CScopedDescriptor&) = delete;
+    ~CScopedDescriptor()
     {
         if (m_fd >= 0) close(m_fd);
     }
@@ -91,7 +91,7 @@ std::string TargetOf(const std::string& path)
 /// Fills a new file and makes sure that the bytes are on the disk.
 bool WriteNewFile(const std::string& path, mode_t mode, bool setMode, std::string_view text)
 {
-    CFileHandle file(open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, mode));
+    CScopedDescriptor file(open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, mode));
     return file.Get() >= 0 && (!setMode || fchmod(file.Get(), mode) == 0) &&
            WriteAll(file.Get(), text) && fsync(file.Get()) == 0 && file.Close();
 }
@@ -100,7 +100,7 @@ bool WriteNewFile(const std::string& path, mode_t mode, bool setMode, std::strin
 void SyncFolder(const std::string& path)
 {
     const std::string folder = std::filesystem::path(path).parent_path().string();
-    const CFileHandle handle(
+    const CScopedDescriptor handle(
         open(folder.empty() ? "." : folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
     if (handle.Get() >= 0) fsync(handle.Get());
 }
@@ -108,7 +108,7 @@ void SyncFolder(const std::string& path)
 /// Devices and pipes have no old content to keep.
 int WriteSpecial(const std::string& path, std::string_view text, T_FILE_ERROR& error)
 {
-    CFileHandle file(open(path.c_str(), O_WRONLY | O_CLOEXEC));
+    CScopedDescriptor file(open(path.c_str(), O_WRONLY | O_CLOEXEC));
     if (file.Get() < 0 || !WriteAll(file.Get(), text) || !file.Close())
         return Refuse(path, "write", errno, error);
     return 1;
@@ -145,7 +145,7 @@ int CFileCtrl::WriteWholeFile(const std::string& path, std::string_view text, T_
 
 int CFileCtrl::ReadWholeFile(const std::string& path, std::string& text, T_FILE_ERROR& error)
 {
-    const CFileHandle file(open(path.c_str(), O_RDONLY | O_CLOEXEC));
+    const CScopedDescriptor file(open(path.c_str(), O_RDONLY | O_CLOEXEC));
     if (file.Get() < 0) return Refuse(path, "open", errno, error);
     struct stat info {};
     if (fstat(file.Get(), &info) != 0) return Refuse(path, "read", errno, error);

@@ -21,25 +21,21 @@ double Rounded(double value, int digits)
     return rounded;
 }
 
-/// Shortest text of a double near `guess` that times `factor` gives `si` to the bit. A text of up
-/// to 15 digits is found by rounding: the guess is at most two units in the last place away.
+/// Shortest text of a double that times the factor gives `si` to the bit. A text of up to 15 digits
+/// is found by rounding; else one of the neighbours of the quotient may have fewer digits.
 std::optional<std::string> ExactText(double si, double guess, double factor)
 {
     const double short15 = Rounded(guess, 15);
     if (short15 * factor == si) return NumberText(short15);
 
     std::optional<std::string> best;
-    const auto consider = [&](double candidate) {
-        if (candidate * factor != si) return;
+    constexpr double inf = std::numeric_limits<double>::infinity();
+    for (const double candidate :
+         {guess, std::nextafter(guess, -inf), std::nextafter(guess, inf)}) {
+        if (candidate * factor != si) continue;
         std::string text = NumberText(candidate);
         if (!best || text.size() < best->size()) best = std::move(text);
-    };
-    constexpr double inf = std::numeric_limits<double>::infinity();
-    const double below = std::nextafter(guess, -inf);
-    const double above = std::nextafter(guess, inf);
-    for (const double candidate : {guess, Rounded(guess, 16), below, above,
-                                   std::nextafter(below, -inf), std::nextafter(above, inf)})
-        consider(candidate);
+    }
     return best;
 }
 

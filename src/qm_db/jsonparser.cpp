@@ -85,7 +85,7 @@ public:
 
     bool key(std::string& name)
     {
-        std::get<T_JSON_MEMBERS>(m_open.back()->data).push_back({std::move(name), {}});
+        std::get<T_JSON_MEMBERS>(m_open.back()->data).emplace_back().key = std::move(name);
         return true;
     }
     bool end_object()
@@ -143,7 +143,7 @@ private:
         if (const auto* numbers = std::get_if<T_JSON_NUMBERS>(&data)) {
             T_JSON_ITEMS items;
             for (const double number : *numbers)
-                items.push_back({number});
+                items.emplace_back().data = number;
             data = std::move(items);
         }
         return std::get<T_JSON_ITEMS>(data).emplace_back(std::move(value));

@@ -26,11 +26,17 @@ std::string TempPath(const std::string& target)
     return target + kMark + std::to_string(::getpid()) + '-' + std::to_string(++counter);
 }
 
-int CreateNew(const std::string& path)
+int CreateNew(const std::string& path, mode_t mode)
 {
-    const int descriptor = ::open(path.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, 0666);
+    const int descriptor = ::open(path.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, mode);
     if (descriptor < 0) ThrowSystem(kCantWrite, errno);
     return descriptor;
+}
+
+bool Exists(const std::string& path)
+{
+    struct stat status = {};
+    return ::stat(path.c_str(), &status) == 0;
 }
 
 std::string FolderOf(const std::string& path)
@@ -63,18 +69,15 @@ bool IsStale(const std::string& path, pid_t process)
 
 } // namespace
 
+// Ours alone until it takes the old file's permissions; without an old file those of any new file.
 CModelTemp::CModelTemp(const std::string& target)
-    : m_target(target), m_path(TempPath(target)), m_file(CreateNew(m_path))
+    : m_target(target), m_path(TempPath(target)), m_targetExists(Exists(target)),
+      m_file(CreateNew(m_path, m_targetExists ? 0600 : 0666))
 {
-    try {
-        if (!m_file.TryLock()) ThrowSystem(kCantWrite, errno);
-        TakeOldPermissions();
-    } catch (...) {
-        ::unlink(m_path.c_str());
-        throw;
-    }
-    struct stat status = {};
-    m_targetExists = ::stat(target.c_str(), &status) == 0;
+    if (m_file.TryLock()) return;
+    const int reason = errno;
+    ::unlink(m_path.c_str());
+    ThrowSystem(kCantWrite, reason);
 }
 
 CModelTemp::~CModelTemp()
@@ -105,6 +108,10 @@ std::unique_ptr<CModelLock> CModelTemp::ReplaceTarget()
         ::open(FolderOf(m_target).c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
     if (!folder.IsOpen()) ThrowSystem(kCantWrite, errno);
 
+    if (m_targetExists) {
+        TakeOldPermissions();
+        Flush();
+    }
     const char* const from = m_path.c_str();
     const char* const to = m_target.c_str();
     int failed = -1;

@@ -7,7 +7,7 @@
 #include <memory>
 #include <string>
 
-/// Empty, locked, with the old file's permissions; removed unless it has replaced the old file.
+/// Empty and locked; removed unless it has replaced the old file, whose permissions it then has.
 /// Failures are thrown as CStoreFault (NoAccess).
 class CModelTemp {
 public:
@@ -32,7 +32,7 @@ private:
 
     std::string m_target;
     std::string m_path;
+    bool m_targetExists;
     CFileHandle m_file;
-    bool m_targetExists = false;
     bool m_isRemoved = false; // nothing left to remove under m_path
 };

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 #include <numbers>
+#include <utility>
 
 namespace {
 
@@ -16,25 +17,42 @@ bool AtOrigin(const T_POINT2& p, const T_POINT2& a, const T_POINT2& b)
            std::fabs(p.y) <= kTouch * std::max(std::fabs(a.y), std::fabs(b.y));
 }
 
-/// First crossing in walk order; `skipOrigin` passes over a crossing at (0, 0).
-std::optional<T_POINT2> FirstCrossing(T_POINT2 P1, T_POINT2 P2, const T_ADRS_VIEW& curve,
-                                      bool skipOrigin)
+/// True when both ends of a segment lie clearly on one side of a line: `a` and `b` are the signed
+/// sides of its ends, `scaleA` and `scaleB` the sizes of the terms they came from.
+bool Aside(double a, double scaleA, double b, double scaleB)
 {
-    for (std::size_t i = 0; i + 1 < curve.Size(); ++i) {
-        const T_POINT2 a = curve.At(i), b = curve.At(i + 1);
+    constexpr double kClear = 1e-6; // far wider than any touch
+    return (a > kClear * scaleA && b > kClear * scaleB) ||
+           (a < -kClear * scaleA && b < -kClear * scaleB);
+}
+
+enum class LINE {
+    Segment,
+    HalfLine,       // starts at P1: on a line of 1e48 no relative touch reaches behind it
+    HalfLineOrigin, // starts at the origin, which itself does not count
+};
+
+/// First crossing in walk order of the line P1-P2.
+std::optional<T_POINT2> FirstCrossing(T_POINT2 P1, T_POINT2 P2, const T_ADRS_VIEW& curve, LINE kind)
+{
+    const double rx = P2.x - P1.x, ry = P2.y - P1.y;
+    double sideA = 0.0, scaleA = 0.0; // of point i
+    for (std::size_t i = 0; i < curve.Size(); ++i) {
+        const double up = rx * (curve.Sa[i] - P1.y), right = ry * (curve.Sd[i] - P1.x);
+        const double side = up - right, scale = std::fabs(up) + std::fabs(right);
+        const double before = std::exchange(sideA, side);
+        const double scaleBefore = std::exchange(scaleA, scale);
+        if (i == 0 || Aside(before, scaleBefore, side, scale)) continue;
+        const T_POINT2 a = curve.At(i - 1), b = curve.At(i);
         double param = 0.0;
         T_POINT2 point;
         if (!CMathFunc::mathIntersectLine2(P1, P2, a, b, kTolerance, param, point)) continue;
-        if (skipOrigin && AtOrigin(point, a, b)) continue;
+        const double ahead = (point.x - P1.x) * rx + (point.y - P1.y) * ry;
+        if (kind != LINE::Segment && ahead < 0.0) continue;
+        if (kind == LINE::HalfLineOrigin && AtOrigin(point, a, b)) continue;
         return point;
     }
     return std::nullopt;
-}
-
-/// Cross product of p and q: above 0 when q is steeper than p, seen from the origin.
-double Steeper(const T_POINT2& p, const T_POINT2& q)
-{
-    return p.x * q.y - p.y * q.x;
 }
 
 /// Walks a demand curve by radial angle, from a remembered index, in amortised constant time.
@@ -64,34 +82,54 @@ struct T_RANGE {
     std::size_t first = 0, last = 0; // demand points
 };
 
-/// Demand points whose segments a capacity segment a-b can meet, one to spare on either side.
-T_RANGE Reachable(const T_POINT2& a, const T_POINT2& b, CAngleCursor& cursor, std::size_t count)
+/// Demand points whose segments a capacity segment can meet, when its ends lie at the cursor
+/// positions i and j: two to spare on either side, for a touch just beyond the ends.
+T_RANGE Reachable(std::size_t i, std::size_t j, std::size_t count)
 {
-    // A touch may lie just beyond the ends.
-    const T_POINT2 from{a.x - kTouch * (b.x - a.x), a.y - kTouch * (b.y - a.y)};
-    const T_POINT2 to{b.x + kTouch * (b.x - a.x), b.y + kTouch * (b.y - a.y)};
-    const bool inQuadrant = std::min({from.x, from.y, to.x, to.y}) >= 0.0;
-    if (!inQuadrant || (a.x == 0.0 && a.y == 0.0) || (b.x == 0.0 && b.y == 0.0))
-        return {0, count - 1};
-    const bool falling = Steeper(to, from) >= 0.0;
-    const std::size_t lo = cursor.Seek(falling ? from : to);
-    const std::size_t hi = cursor.Seek(falling ? to : from);
+    const std::size_t lo = std::min(i, j), hi = std::max(i, j);
     return {lo < 2 ? 0 : lo - 2, std::min(hi + 2, count - 1)};
+}
+
+/// True when one end is so near the origin, seen from the other, that its angle means nothing.
+bool NearOrigin(const T_POINT2& a, const T_POINT2& b)
+{
+    constexpr double kNear = 1e-6;
+    return (a.x <= kNear * b.x && a.y <= kNear * b.y) || (b.x <= kNear * a.x && b.y <= kNear * a.y);
+}
+
+/// True when the whole range of the demand lies clearly above the segment a-b.
+bool Above(const T_POINT2& a, const T_POINT2& b, const T_ADRS_VIEW& demand, T_RANGE range)
+{
+    const double level = std::max(a.y, b.y) * (1.0 + 1e-6);
+    std::size_t above = 0;
+    for (std::size_t k = range.first; k <= range.last; ++k)
+        above += demand.Sa[k] > level;
+    return above == range.last - range.first + 1;
+}
+
+/// True when a point of the range has no ordinate above 0, hence no radial angle.
+bool HasZero(const T_ADRS_VIEW& demand, T_RANGE range)
+{
+    std::size_t positive = 0;
+    for (std::size_t k = range.first; k <= range.last; ++k)
+        positive += demand.Sa[k] > 0.0;
+    return positive != range.last - range.first + 1;
 }
 
 /// True when no demand point of the range comes to the other side of the line a-b, nor near it.
 bool OneSided(const T_POINT2& a, const T_POINT2& b, const T_ADRS_VIEW& demand, T_RANGE range)
 {
+    constexpr double kClear = 1e-6; // far wider than any touch
     const double rx = b.x - a.x, ry = b.y - a.y;
-    double least = INFINITY, most = -INFINITY, scale = 0.0;
+    std::size_t above = 0, below = 0;
     for (std::size_t k = range.first; k <= range.last; ++k) {
-        const double s = rx * (demand.Sa[k] - a.y), t = ry * (demand.Sd[k] - a.x);
-        least = std::min(least, s - t);
-        most = std::max(most, s - t);
-        scale = std::max(scale, std::fabs(s) + std::fabs(t));
+        const double up = rx * (demand.Sa[k] - a.y), right = ry * (demand.Sd[k] - a.x);
+        const double clear = kClear * (std::fabs(up) + std::fabs(right));
+        above += up - right > clear;
+        below += up - right < -clear;
     }
-    const double margin = 1e-6 * scale; // far wider than any touch
-    return least > margin || most < -margin;
+    const std::size_t count = range.last - range.first + 1;
+    return above == count || below == count;
 }
 
 /// Crossing nearest the start of the capacity segment a-b.
@@ -117,7 +155,8 @@ std::optional<T_POINT2> Nearest(const T_POINT2& a, const T_POINT2& b, const T_AD
 
 std::optional<T_POINT2> CCurveCrossing::HalfLine(T_POINT2 toward, const T_ADRS_VIEW& curve)
 {
-    return FirstCrossing({0.0, 0.0}, {toward.x * kFar, toward.y * kFar}, curve, true);
+    return FirstCrossing({0.0, 0.0}, {toward.x * kFar, toward.y * kFar}, curve,
+                         LINE::HalfLineOrigin);
 }
 
 std::optional<T_POINT2> CCurveCrossing::PeriodLine(double T, double gravity,
@@ -130,27 +169,33 @@ std::optional<T_POINT2> CCurveCrossing::PeriodLine(double T, double gravity,
 
 std::optional<T_POINT2> CCurveCrossing::Vertical(double d, const T_ADRS_VIEW& curve)
 {
-    return FirstCrossing({d, 0.0}, {d, kFar}, curve, false);
+    return FirstCrossing({d, 0.0}, {d, kFar}, curve, LINE::HalfLine);
 }
 
 std::optional<T_POINT2> CCurveCrossing::Segment(T_POINT2 P1, T_POINT2 P2, const T_ADRS_VIEW& curve)
 {
-    return FirstCrossing(P1, P2, curve, false);
+    return FirstCrossing(P1, P2, curve, LINE::Segment);
 }
 
 std::optional<T_POINT2> CCurveCrossing::CapacityWithDemand(const T_ADRS_VIEW& capacity,
                                                            const T_ADRS_VIEW& demand)
 {
     if (capacity.Size() < 2 || demand.Size() < 2) return std::nullopt;
-    // Points ascending in period fall in radial angle; a zero ordinate has no angle.
-    const bool ordered =
-        std::all_of(demand.Sa.begin(), demand.Sa.end(), [](double a) { return a > 0.0; });
+    // Points ascending in period fall in radial angle. A zero ordinate has no angle: the cursor
+    // stops there, and the whole demand is searched. Ordinates of both signs don't occur beyond
+    // the first period, since factors act on whole branches.
+    const std::size_t last = demand.Size() - 1;
+    const bool ordered = demand.Sa[0] > 0.0 && demand.Sa[1] > 0.0 && demand.Sa[last] > 0.0;
     CAngleCursor cursor(demand);
+    std::size_t at = ordered ? cursor.Seek(capacity.At(0)) : 0;
     for (std::size_t i = 0; i + 1 < capacity.Size(); ++i) {
         const T_POINT2 a = capacity.At(i), b = capacity.At(i + 1);
-        T_RANGE range{0, demand.Size() - 1};
+        T_RANGE range{0, last};
         if (ordered) {
-            range = Reachable(a, b, cursor, demand.Size());
+            const std::size_t before = std::exchange(at, cursor.Seek(b));
+            if (!NearOrigin(a, b)) range = Reachable(before, at, demand.Size());
+            if (Above(a, b, demand, range)) continue;
+            if (HasZero(demand, range)) range = {0, last};
             if (OneSided(a, b, demand, range)) continue;
         }
         if (const auto point = Nearest(a, b, demand, range)) return point;

@@ -30,7 +30,8 @@ enum class PUSH_OUTCOME {
     NoTarget,
     BilinearTooShort,
     ZeroDemand,
-    TargetBeyond
+    TargetBeyond,
+    TrialBeyond // no trial point either: the capacity ends before it
 };
 
 /// An outcome with its number, where it has one (trials of a cycle).

@@ -74,7 +74,7 @@ int CPushOverCalcPerfPtBase::FindInitialTrialPoint(double D1, double A1, double&
     m_outcome = {PUSH_OUTCOME::NoTrialPoint, 0};
     const auto demand = CCurveCrossing::HalfLine({D1, A1}, m_owner.Demand().View());
     if (!demand) return 0;
-    m_outcome = {PUSH_OUTCOME::CurveTooShort, 0};
+    m_outcome = {PUSH_OUTCOME::TrialBeyond, 0};
     const auto trial = CCurveCrossing::Vertical(demand->x, Capacity().View());
     if (!trial) return 0;
     Dd = demand->x;

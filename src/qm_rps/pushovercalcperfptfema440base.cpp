@@ -12,7 +12,7 @@ int CPushOverCalcPerfPtFEMA440Base::FindTrialPointOnWorkingSpectrum(double D, do
     double d = 0.0, a = 0.0;
     m_outcome = {PUSH_OUTCOME::NoTrialPoint, 0};
     if (!m_working.OnRadialLine(D, A, d, a)) return 0;
-    m_outcome = {PUSH_OUTCOME::CurveTooShort, 0};
+    m_outcome = {PUSH_OUTCOME::TrialBeyond, 0};
     if (withCapacity && !GetCapacityPointAtDisplacement2(d, a, Dc, Ac)) return 0;
     Ds = d;
     As = a;

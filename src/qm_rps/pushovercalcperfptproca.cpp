@@ -24,6 +24,8 @@ int CPushOverCalcPerfPtProcA::CalcTrial(double dpi, double api, double& Di, doub
     }
     row.dy = dy;
     row.ay = ay;
+    row.mu = dpi / dy;
+    row.Teff = PeriodOf(dpi, api);
     GDebugOut("#%d Dy:%g Ay:%g", m_iteration, dy, ay);
     if (std::fabs(api * dpi) < kZeroTrial) return End(PUSH_OUTCOME::ZeroTrial, 0);
 

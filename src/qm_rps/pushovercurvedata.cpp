@@ -112,7 +112,7 @@ void CPushOverCurveData::CalcMassFactors(double control)
 {
     const auto d = static_cast<std::size_t>(std::min(Direction(), 2));
     const bool uniform = m_polc.patternKind == kUniformAcceleration;
-    double S1 = 0.0, S2 = 0.0;
+    double S1 = 0.0, S2 = 0.0, terms = 0.0;
     for (const T_NODAL_MASS& nodal : CStoryLoad(m_doc.Data()).Calc_Nodal_Mass()) {
         for (std::size_t k = 0; k < 3; ++k)
             m_mass[k] += nodal.mass[k];
@@ -121,10 +121,12 @@ void CPushOverCurveData::CalcMassFactors(double control)
         m_doc.Post().GetEiMode(nodal.node, shape);
         const double phi = uniform ? 1.0 : shape[d] / control;
         S1 += phi * nodal.mass[d];
+        terms += std::fabs(phi * nodal.mass[d]);
         S2 += phi * phi * nodal.mass[d];
     }
     const double total = DirectionMass(Direction());
     if (S2 == 0.0 || total == 0.0) return;
+    if (std::fabs(S1) <= kNoParticipation * terms) return; // what is left is rounding
     m_massGamma = S1 / S2;
     m_massAlpha = S1 * S1 / (total * S2);
 }
@@ -158,15 +160,15 @@ void CPushOverCurveData::CalcConversion()
             if (m_factors.gamma != 0.0) m_factors.alpha = percent.percent[d] / 100.0;
         }
     } else {
-        m_factors.gamma = std::fabs(m_massGamma);
+        m_factors.gamma = m_massGamma; // keeps its sign, on purpose
         m_factors.alpha = m_massAlpha;
     }
     double forceScale = 0.0;
     if (m_polc.patternKind == kUniformAcceleration)
         forceScale = std::fabs(m_factors.mass);
     else if (m_factors.gamma != 0.0)
-        forceScale = std::fabs(m_factors.mass * m_factors.alpha) / m_factors.gamma;
-    m_conversionError = m_factors.gamma == 0.0 || forceScale == 0.0 || m_factors.alpha == 0.0 ||
+        forceScale = std::fabs(m_factors.mass * m_factors.alpha) / std::fabs(m_factors.gamma);
+    m_conversionError = std::fabs(m_factors.gamma) < kNoParticipation || forceScale == 0.0 || m_factors.alpha == 0.0 ||
                         !std::isfinite(m_factors.gamma) || !std::isfinite(forceScale);
 }
 

@@ -114,10 +114,9 @@ int CPushOverCurveDlg::CalcPushoverCurve()
                                                    {m_eval.push, m_curve.Error()}));
         return 0;
     }
-    WarnAboutCurve();
-    if (!CheckCurve()) return 0;
     SetCapacity({m_curve.Displacement(), m_curve.Force()});
-    return 1;
+    WarnAboutCurve();
+    return CheckCurve();
 }
 
 // What makes a capacity spectrum impossible.
