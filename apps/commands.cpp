@@ -4,16 +4,19 @@
 #include "qm_db/casefile.h"
 #include "qm_db/filectrl.h"
 #include "qm_db/modelstore.h"
+#include "qm_rps/pushovercomparison.h"
 #include "qm_rps/pushovercurvedlg.h"
 #include "qm_rps/pushoverreport.h"
 #include "resultjson.h"
 #include "resulttable.h"
 
 #ifdef QM_UI
+#include "qm_ui/comparisonplot.h"
 #include "qm_ui/evaluationplot.h"
 #include "qm_ui/plotfile.h"
 #endif
 
+#include <algorithm>
 #include <cstdio>
 #include <vector>
 
@@ -25,9 +28,31 @@ EXIT_CODE Complain(EXIT_CODE code, const std::string& text)
     return code;
 }
 
-/// Evaluates what was asked for; false after a message on stderr.
-EXIT_CODE EvaluateAll(CDBDoc& doc, const std::string& only, std::vector<T_PUSH_EVALUATION>& out)
+/// Additional steps and spectra; false after a message on stderr.
+bool AddExtras(CPushOverCurveDlg& driver, const T_EVALUATE_OPTIONS& options)
 {
+    const auto refused = [&](const std::string& what) {
+        const auto& messages = driver.Messages();
+        Complain(EXIT_CODE::Usage, what + ": " +
+                                       (messages.empty() ? "not possible with this evaluation"
+                                                         : messages.back().text));
+        return false;
+    };
+    for (const int step : options.steps) {
+        if (!driver.OnPushoverCurveAddStep(step)) return refused("step " + std::to_string(step));
+    }
+    for (const std::string& spectrum : options.spectra) {
+        if (!driver.Result().IsTarget() && !driver.CalcAdditionalPerformancePoint(spectrum))
+            return refused("spectrum \"" + spectrum + "\"");
+    }
+    return true;
+}
+
+/// Evaluates what was asked for; false after a message on stderr.
+EXIT_CODE EvaluateAll(CDBDoc& doc, const T_EVALUATE_OPTIONS& options,
+                      std::vector<T_PUSH_EVALUATION>& out)
+{
+    const std::string& only = options.only;
     CPushOverCurveDlg driver(doc);
     for (const auto& entry : doc.Data().Model().evaluations) {
         if (!only.empty() && entry.second.name != only) continue;
@@ -37,6 +62,7 @@ EXIT_CODE EvaluateAll(CDBDoc& doc, const std::string& only, std::vector<T_PUSH_E
             return Complain(EXIT_CODE::BadInput, doc.Path() + ": evaluation \"" + eval.name +
                                                      "\": " + driver.SettingsError());
         driver.Evaluate();
+        if (!AddExtras(driver, options)) return EXIT_CODE::Usage;
         out.push_back(driver.Result());
     }
     if (!out.empty()) return EXIT_CODE::Done;
@@ -65,14 +91,23 @@ std::string NumberedPath(const std::string& path, std::size_t index, std::size_t
     return stem + "-" + std::to_string(index + 1) + path.substr(stem.size());
 }
 
+#ifdef QM_UI
+EXIT_CODE WritePlot(const T_PLOT& plot, const std::string& path)
+{
+    std::string error;
+    if (WritePlotFile(plot, path, error)) return EXIT_CODE::Done;
+    return Complain(EXIT_CODE::NoAccess, error);
+}
+#endif
+
 EXIT_CODE WritePlots(const std::string& path, const std::vector<T_PUSH_EVALUATION>& results)
 {
 #ifdef QM_UI
     for (std::size_t i = 0; i < results.size(); ++i) {
         const std::string file = NumberedPath(path, i, results.size());
-        std::string error;
-        if (!WritePlotFile(EvaluationPlot(results[i]), file, error))
-            return Complain(EXIT_CODE::NoAccess, error);
+        if (const EXIT_CODE code = WritePlot(EvaluationPlot(results[i]), file);
+            code != EXIT_CODE::Done)
+            return code;
     }
     return EXIT_CODE::Done;
 #else
@@ -147,13 +182,34 @@ EXIT_CODE RunInfo(const std::string& file, bool check)
     return EXIT_CODE::Done;
 }
 
+EXIT_CODE RunCompare(const T_COMPARE_OPTIONS& o)
+{
+    CDBDoc doc;
+    if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
+    T_PUSH_COMPARISON comparison;
+    std::string error;
+    if (!ComparePushover(doc, o.push, o.spectrum, o.behavior, comparison, error))
+        return Complain(EXIT_CODE::Usage, o.file + ": " + error);
+    EXIT_CODE code = EXIT_CODE::Done;
+    if (!o.json.empty()) code = WriteOutput(o.json, ResultJson(comparison.results));
+#ifdef QM_UI
+    if (code == EXIT_CODE::Done && !o.plot.empty())
+        code = WritePlot(ComparisonPlot(comparison), o.plot);
+#else
+    if (!o.plot.empty()) code = Complain(EXIT_CODE::Usage, "built without pictures");
+#endif
+    if (code != EXIT_CODE::Done) return code;
+    if (o.json != "-") std::printf("%s", ComparisonTable(comparison).c_str());
+    const bool all = std::ranges::all_of(comparison.rows, &T_COMPARISON_ROW::found);
+    return all ? EXIT_CODE::Done : EXIT_CODE::NotFound;
+}
+
 EXIT_CODE RunEvaluate(const T_EVALUATE_OPTIONS& o)
 {
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     std::vector<T_PUSH_EVALUATION> results;
-    if (const EXIT_CODE code = EvaluateAll(doc, o.only, results); code != EXIT_CODE::Done)
-        return code;
+    if (const EXIT_CODE code = EvaluateAll(doc, o, results); code != EXIT_CODE::Done) return code;
     if (const EXIT_CODE code = WriteResults(o, results); code != EXIT_CODE::Done) return code;
     if (o.json != "-") std::printf("%s", ResultTable(results).c_str());
     if (o.trace && o.json != "-") {

@@ -4,14 +4,17 @@
 #include "exitcodes.h"
 
 #include <string>
+#include <vector>
 
 struct T_EVALUATE_OPTIONS {
     std::string file;
-    std::string only;   // name of one evaluation; empty: all
-    std::string json;   // file, or "-" for standard output
-    std::string report; // text report
-    std::string curve;  // curve table alone
-    std::string plot;   // .svg, .png or .pdf
+    std::string only;                 // name of one evaluation; empty: all
+    std::string json;                 // file, or "-" for standard output
+    std::string report;               // text report
+    std::string curve;                // curve table alone
+    std::string plot;                 // .svg, .png or .pdf
+    std::vector<int> steps;           // additional steps to list
+    std::vector<std::string> spectra; // additional spectra for performance points
     bool trace = false;
     bool noStore = false; // don't store the limit-state steps in a model file
 };
@@ -19,4 +22,15 @@ struct T_EVALUATE_OPTIONS {
 EXIT_CODE RunImport(const std::string& caseFile, const std::string& modelFile);
 EXIT_CODE RunExport(const std::string& modelFile, const std::string& caseFile);
 EXIT_CODE RunInfo(const std::string& file, bool check);
+
+struct T_COMPARE_OPTIONS {
+    std::string file;
+    std::string push;     // name of the pushover load case
+    std::string spectrum; // name of the spectrum
+    int behavior = 0;
+    std::string json; // file, or "-"
+    std::string plot; // .svg, .png or .pdf
+};
+
+EXIT_CODE RunCompare(const T_COMPARE_OPTIONS& options);
 EXIT_CODE RunEvaluate(const T_EVALUATE_OPTIONS& options);

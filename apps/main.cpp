@@ -51,10 +51,31 @@ void AddEvaluate(CLI::App& app, EXIT_CODE& code)
     sub->add_option("--plot", o->plot,
                     "Draw the picture: .svg, .png or .pdf (several evaluations: "
                     "numbered before the extension)");
+    sub->add_option("--add-step", o->steps,
+                    "List a step of the curve beside the result (up to 10)");
+    sub->add_option("--add-spectrum", o->spectra,
+                    "Performance point for another spectrum too (up to 10)");
     sub->add_flag("--trace", o->trace, "Print every trial");
     sub->add_flag("--no-store", o->noStore, "Don't store limit-state steps in the model file");
     sub->footer("Example:\n  qm-rps evaluate examples/first-steps/case.json --trace");
     sub->callback([=, &code] { code = RunEvaluate(*o); });
+}
+
+void AddCompare(CLI::App& app, EXIT_CODE& code)
+{
+    auto* sub = app.add_subcommand("compare", "Run every method on one curve, with the spread");
+    auto o = std::make_shared<T_COMPARE_OPTIONS>();
+    sub->add_option("FILE", o->file, "Model file (.qmdb) or case file (.json)")->required();
+    sub->add_option("--push", o->push, "Name of the pushover load case")->required();
+    sub->add_option("--spectrum", o->spectrum, "Name of the spectrum")->required();
+    sub->add_option("--behavior", o->behavior, "Structural behaviour or hysteresis model, 0 to 2")
+        ->check(CLI::Range(0, 2))
+        ->capture_default_str();
+    sub->add_option("--json", o->json, "Write the results as JSON; - for standard output");
+    sub->add_option("--plot", o->plot, "Draw the picture: .svg, .png or .pdf");
+    sub->footer("Example:\n  qm-rps compare examples/first-steps/case.json --push PX "
+                "--spectrum ATC");
+    sub->callback([=, &code] { code = RunCompare(*o); });
 }
 
 } // namespace
@@ -79,6 +100,7 @@ int main(int argc, char** argv)
     AddExport(app, code);
     AddInfo(app, code);
     AddEvaluate(app, code);
+    AddCompare(app, code);
     try {
         app.parse(argc, argv);
     } catch (const CLI::ParseError& e) {

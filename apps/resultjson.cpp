@@ -14,6 +14,12 @@ json OrNull(const std::optional<T>& v)
     return v ? json(*v) : json(nullptr);
 }
 
+const char* StatusName(int result)
+{
+    static constexpr const char* kStatus[] = {"not found", "found", "elastic"};
+    return kStatus[result];
+}
+
 json FactorsJson(const T_PUSH_FACTORS& f)
 {
     return {{"gamma", f.gamma},
@@ -100,21 +106,48 @@ json TrialJson(const T_PERFPT_TRIAL& t)
     return row;
 }
 
+void AddPoints(json& o, const T_PUSH_EVALUATION& e)
+{
+    if (!e.IsTarget()) {
+        o["all_points"] = json::array();
+        for (const T_PERF_POINT& p : e.allPoints)
+            o["all_points"].push_back(PointJson(p));
+    }
+    if (!e.additionalSteps.empty()) o["additional_steps"] = json::array();
+    for (const T_ADDITIONAL_STEP& s : e.additionalSteps)
+        o["additional_steps"].push_back(
+            {{"step", s.step}, {"D", s.D}, {"V", s.V}, {"Sd", s.Sd}, {"Sa", s.Sa}});
+    if (!e.additionalPoints.empty()) o["additional_points"] = json::array();
+    for (const T_ADDITIONAL_POINT& p : e.additionalPoints)
+        o["additional_points"].push_back({{"spectrum", p.spectrum},
+                                          {"status", StatusName(p.result)},
+                                          {"performance_point", PointJson(p.point)},
+                                          {"outcome", {{"name", OutcomeName(p.outcome)}}}});
+}
+
+/// The advice, with what the balanced points add to it.
+std::string Advice(const T_PUSH_EVALUATION& e)
+{
+    const std::string advice = OutcomeAdvice(e.outcome);
+    return e.pointNote.empty() ? advice : advice + " " + e.pointNote;
+}
+
 json EvaluationJson(const T_PUSH_EVALUATION& e)
 {
-    static constexpr const char* kStatus[] = {"not found", "found", "elastic"};
     json o{{"name", e.eval.name},
            {"push", e.eval.push},
            {"method", MethodName(e.eval.method)},
            {"procedure", std::string(1, e.procedure)},
-           {"status", kStatus[e.result]},
+           {"status", StatusName(e.result)},
            {"factors", FactorsJson(e.factors)},
            {"capacity", {{"Sd", e.capacity.Sd}, {"Sa", e.capacity.Sa}}},
            {"performance_point", PointJson(e.point)},
            {"target", TargetJson(e)},
            {"limit_states", LimitStatesJson(e)},
-           {"outcome", {{"name", OutcomeName(e.outcome)}, {"advice", OutcomeAdvice(e.outcome)}}},
+           {"outcome", {{"name", OutcomeName(e.outcome)}, {"advice", Advice(e)}}},
            {"messages", json::array()}};
+    o["factors"]["note"] = e.gammaNote;
+    AddPoints(o, e);
     for (const auto& m : e.messages)
         o["messages"].push_back({{"key", m.key}, {"text", m.text}});
     o["trials"] = e.trace.size();

@@ -57,6 +57,26 @@ std::string StateLines(const T_PUSH_EVALUATION& e)
     return text;
 }
 
+std::string AdditionalLines(const T_PUSH_EVALUATION& e, int width)
+{
+    std::string text;
+    if (e.allPoints.size() > 1) {
+        text += FormatText("%-*s   demand equals capacity at D =", width, "");
+        for (const T_PERF_POINT& p : e.allPoints)
+            text += FormatText(" %.5g", p.D);
+        text += "\n";
+    }
+    for (const T_ADDITIONAL_STEP& s : e.additionalSteps)
+        text += FormatText("%-*s   step %d: D = %.5g, V = %.5g, Sd = %.5g, Sa = %.5g\n", width, "",
+                           s.step, s.D, s.V, s.Sd, s.Sa);
+    for (const T_ADDITIONAL_POINT& p : e.additionalPoints)
+        text +=
+            FormatText("%-*s   spectrum %s: %s, D = %s, V = %s\n", width, "", p.spectrum.c_str(),
+                       OutcomeName(p.outcome).c_str(), p.point ? Number(p.point->D).c_str() : "-",
+                       p.point ? Number(p.point->V).c_str() : "-");
+    return text;
+}
+
 } // namespace
 
 std::string ResultTable(const std::vector<T_PUSH_EVALUATION>& results)
@@ -77,9 +97,34 @@ std::string ResultTable(const std::vector<T_PUSH_EVALUATION>& results)
     for (const auto& e : results) {
         text += FormatText("%-*s %s: %s\n", width, e.eval.name.c_str(),
                            OutcomeName(e.outcome).c_str(), OutcomeAdvice(e.outcome).c_str());
+        if (!e.pointNote.empty())
+            text += FormatText("%-*s   > %s\n", width, "", e.pointNote.c_str());
+        text += AdditionalLines(e, width);
         for (const auto& m : e.messages)
             text += FormatText("%-*s   ! %s\n", width, "", m.text.c_str());
     }
+    return text;
+}
+
+std::string ComparisonTable(const T_PUSH_COMPARISON& c)
+{
+    if (c.results.empty()) return {};
+    const std::string F(NameOf(c.results[0].units.force)), L(NameOf(c.results[0].units.length));
+    std::string text = FormatText("%-12s %12s %12s %12s %10s %9s  %s\n", "method",
+                                  ("D [" + L + "]").c_str(), ("V [" + F + "]").c_str(),
+                                  ("Sd [" + L + "]").c_str(), "Sa [g]", "D / mean", "outcome");
+    for (const T_COMPARISON_ROW& row : c.rows) {
+        const auto value = [&](double v) { return row.found ? FormatText("%.5g", v) : "-"; };
+        text += FormatText("%-12s %12s %12s %12s %10s %9s  %s\n", row.label.c_str(),
+                           value(row.D).c_str(), value(row.V).c_str(), value(row.Sd).c_str(),
+                           value(row.Sa).c_str(),
+                           row.found ? FormatText("%.3f", row.D / c.meanD).c_str() : "-",
+                           OutcomeName(row.outcome).c_str());
+    }
+    if (c.count > 0)
+        text += FormatText("\nspread of D over %d methods: %.5g to %.5g %s, mean %.5g, "
+                           "largest / smallest %.3f\n",
+                           c.count, c.minD, c.maxD, L.c_str(), c.meanD, c.maxD / c.minD);
     return text;
 }
 

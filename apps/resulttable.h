@@ -1,7 +1,7 @@
 // Results as short text tables for the terminal.
 #pragma once
 
-#include "qm_rps/pushevaluation.h"
+#include "qm_rps/pushovercomparison.h"
 
 #include <string>
 #include <vector>
@@ -11,6 +11,9 @@ std::string ResultTable(const std::vector<T_PUSH_EVALUATION>& results);
 
 /// The trials of one evaluation, one line each.
 std::string TraceTable(const T_PUSH_EVALUATION& e);
+
+/// All methods side by side, with the spread.
+std::string ComparisonTable(const T_PUSH_COMPARISON& c);
 
 /// What a document holds: title, units, counts, load cases, evaluations, stored steps.
 std::string InfoText(CDBDoc& doc);

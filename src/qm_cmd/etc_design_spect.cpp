@@ -88,6 +88,13 @@ void CETC_DESIGN_SPECT::CalcPOSpectrumSRaSRv(double SRa, double SRv, std::vector
         Sa[i] = std::min(f.SRa * m_A[i], f.SRv * m_V[i]);
 }
 
+double CETC_DESIGN_SPECT::CalcPOOrdinate(double SRa, double SRv, std::size_t i) const
+{
+    T_SPEC_REDUCTION f{SRa, SRv};
+    if (HasFloors()) ApplyReductionFloors(m_behaviorType, f);
+    return std::min(f.SRa * m_A[i], f.SRv * m_V[i]);
+}
+
 int CETC_DESIGN_SPECT::CalcPOSpectrumByDamping(double betaPct, std::vector<double>& T,
                                                std::vector<double>& Sa) const
 {

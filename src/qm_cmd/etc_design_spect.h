@@ -54,6 +54,11 @@ public:
     void CalcPOSpectrumSRaSRv(double SRa, double SRv, std::vector<double>& T,
                               std::vector<double>& Sa) const;
 
+    /// Periods of the grid, ascending, s.
+    const std::vector<double>& Periods() const { return m_T; }
+    /// One ordinate of CalcPOSpectrumSRaSRv, at grid point i.
+    double CalcPOOrdinate(double SRa, double SRv, std::size_t i) const;
+
     /// The spectrum for an effective damping in per cent: by the code's own damping correction
     /// where it has one, else by SRA and SRV. 1 done; 0 the damping is not above 0.
     [[nodiscard]] int CalcPOSpectrumByDamping(double betaPct, std::vector<double>& T,

@@ -22,3 +22,11 @@ T_MODEL& CDataCtrl::ModelForEdit()
     ++m_revision;
     return m_content.model;
 }
+
+void CDataCtrl::SetPoverSteps(int pushover, const T_POVR_D& steps)
+{
+    const auto [it, isNew] = m_content.model.poverSteps.try_emplace(pushover);
+    if (!isNew && it->second == steps) return;
+    it->second = steps;
+    m_modified = true;
+}

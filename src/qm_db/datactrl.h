@@ -58,6 +58,10 @@ public:
     /// Grows with every change; lets readers keep derived values until something changed.
     long Revision() const { return m_revision; }
 
+    /// Stores the limit-state steps of a load case. They derive from the rest, so the revision
+    /// stays; the document counts as modified only when they differ from what is stored.
+    void SetPoverSteps(int pushover, const T_POVR_D& steps);
+
     /// For CEditData and CUndoCtrl only: the model to change; marks the document modified.
     T_MODEL& ModelForEdit();
 

@@ -5,14 +5,28 @@
 #include <algorithm>
 #include <cmath>
 
+namespace {
+
+T_POVR_D StepsOf(const CDataCtrl& data, int loadCase)
+{
+    const auto it = data.Model().poverSteps.find(loadCase);
+    return it == data.Model().poverSteps.end() ? T_POVR_D{} : it->second;
+}
+
+} // namespace
+
 void CPoverInfo::SetStepEC8(int loadCase, int stepDL, int stepSD, int stepNC)
 {
-    m_data.ModelForEdit().poverSteps[loadCase].ec8 = {stepDL, stepSD, stepNC};
+    T_POVR_D steps = StepsOf(m_data, loadCase);
+    steps.ec8 = {stepDL, stepSD, stepNC};
+    m_data.SetPoverSteps(loadCase, steps);
 }
 
 void CPoverInfo::SetStepNTC2008(int loadCase, int stepSLD, int stepSLV, int stepSLC)
 {
-    m_data.ModelForEdit().poverSteps[loadCase].ntc = {stepSLD, stepSLV, stepSLC};
+    T_POVR_D steps = StepsOf(m_data, loadCase);
+    steps.ntc = {stepSLD, stepSLV, stepSLC};
+    m_data.SetPoverSteps(loadCase, steps);
 }
 
 int CPoverInfo::GetStepEC8(int loadCase, std::array<int, 3>& out) const
@@ -214,8 +228,9 @@ bool CPostCtrl::ExistNodePost(int node) const
 }
 
 // Mean displacement of a storey's nodes that have results; weighted by mass where asked for and
-// where the storey has mass in the direction.
-double CPostCtrl::StoreyMean(const T_STOR_D& storey, std::size_t step, bool byMass, int direction)
+// where the storey has mass in the direction. Empty where no node has results.
+std::optional<double> CPostCtrl::StoreyMean(const T_STOR_D& storey, std::size_t step, bool byMass,
+                                            int direction)
 {
     double sum = 0.0, weight = 0.0, plain = 0.0;
     int count = 0;
@@ -231,26 +246,34 @@ double CPostCtrl::StoreyMean(const T_STOR_D& storey, std::size_t step, bool byMa
         plain += (*series)[step];
         ++count;
     }
-    if (byMass && weight > 0.0) return sum / weight;
-    return count > 0 ? plain / count : 0.0;
+    if (count == 0) return std::nullopt;
+    return byMass && weight > 0.0 ? sum / weight : plain / count;
 }
 
 int CPostCtrl::GetPushoverStoryDriftRatio(int loadCase, int step, double& kind1, double& kind2)
 {
     const auto& storeys = m_data.Model().storeys;
+    m_error.clear();
     if (storeys.empty() || !SelectPushover(loadCase) || !SelectStep(step)) return 0;
     const auto index = static_cast<std::size_t>(step - 1);
     std::array<double, 2> below{}, largest{};
+    double height = 0.0; // from the last level that is known
+    bool known = false;
     for (const auto& entry : storeys) {
         const T_STOR_D& storey = entry.second;
-        const double h = FromSi(storey.height, m_data.Units(), kDimLength);
+        height += FromSi(storey.height, m_data.Units(), kDimLength);
+        const auto plain = StoreyMean(storey, index, false, Direction());
+        const auto centre = StoreyMean(storey, index, true, Direction());
+        if (!plain || !centre || !(height > 0.0)) continue;
+        const std::array<double, 2> u{*plain, *centre};
         for (std::size_t k = 0; k < 2; ++k) {
-            const double u = StoreyMean(storey, index, k == 1, Direction());
-            if (h > 0.0) largest[k] = std::max(largest[k], std::fabs(u - below[k]) / h);
-            below[k] = u;
+            largest[k] = std::max(largest[k], std::fabs(u[k] - below[k]) / height);
+            below[k] = u[k];
         }
+        height = 0.0;
+        known = true;
     }
-    if (!m_error.empty()) return 0;
+    if (!m_error.empty() || !known) return 0;
     kind1 = largest[0];
     kind2 = largest[1];
     return 1;

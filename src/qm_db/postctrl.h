@@ -67,17 +67,16 @@ public:
     /// Storey drift ratios of a step, largest over the storeys: kind 1 by the storey's vertical
     /// node pairs (for curve data the mean over the storey's nodes), kind 2 at the storey's centre
     /// of mass. Storey drift = |u(i) - u(i-1)| / h(i), the ground being at rest. Nodes without
-    /// results do not count. 1 done; 0 no storeys or no results, outputs as they were.
+    /// results do not count; a storey without any adds its height to the next one. 1 done; 0 no
+    /// storeys or no results, outputs as they were.
     [[nodiscard]] int GetPushoverStoryDriftRatio(int loadCase, int step, double& kind1,
                                                  double& kind2);
 
 private:
-    struct T_SERIES {
-        std::vector<double> values; // current units, one per step
-    };
     int ReadSeries(int node, const std::vector<double>*& out);
     int ReadCurve();
-    double StoreyMean(const T_STOR_D& storey, std::size_t step, bool byMass, int direction);
+    std::optional<double> StoreyMean(const T_STOR_D& storey, std::size_t step, bool byMass,
+                                     int direction);
     void DeriveParticipation(const T_EIGV_D& mode, T_MPAF_D& factor, T_MPAM_D& percent) const;
     IPushResult* Source() const;
     int Direction() const; // 0 to 5

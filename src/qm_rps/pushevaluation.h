@@ -31,6 +31,21 @@ struct T_GUIDE_LINE {
     std::string label;
 };
 
+/// A step that the engineer asked for: MDOF values.
+struct T_ADDITIONAL_STEP {
+    int step = 0;
+    double D = 0.0, V = 0.0;   // control displacement, base shear
+    double Sd = 0.0, Sa = 0.0; // SDOF
+};
+
+/// A performance point for another spectrum on the same curve.
+struct T_ADDITIONAL_POINT {
+    std::string spectrum;
+    int result = 0;
+    std::optional<T_PERF_POINT> point;
+    T_OUTCOME outcome;
+};
+
 /// A curve in the coordinates of a plot type.
 struct T_PLOTTED_CURVE {
     PLOT_TYPE type = PLOT_TYPE::Atc40;
@@ -46,14 +61,20 @@ struct T_PUSH_EVALUATION {
     T_PUSH_FACTORS factors;
     double mStar = 0.0; // mass of the equivalent system
 
-    T_ADRS_CURVE capacity;     // index = step; 0 is a tenth of step 1
-    T_ADRS_CURVE demand;       // the record at its own damping
-    T_ADRS_CURVE reduced;      // at the performance point, may be empty
+    T_ADRS_CURVE capacity;                  // index = step; 0 is a tenth of step 1
+    T_ADRS_CURVE demand;                    // the record at its own damping; NTC: SLV
+    std::vector<T_ADRS_CURVE> stateDemands; // NTC: SLO, SLD, SLV, SLC; empty where not enabled
+    std::string gammaNote;                  // how Gamma is defined for this method
+    T_ADRS_CURVE reduced;                   // at the performance point, may be empty
     T_ADRS_CURVE working;      // FEMA 440: the last reduced or modified spectrum, may be empty
     T_ADRS_CURVE locus;        // ATC-40 B, FEMA 440 C: demand points, may be empty
     std::vector<double> teffs; // ATC-40 B: T0 and Teff at ductility 2, 4, 6, 8
     std::optional<T_PERF_POINT> point;
     std::vector<T_PERFPT_TRIAL> trace;
+    std::vector<T_PERF_POINT> allPoints; // where demand equals capacity, in the curve's order
+    std::string pointNote; // how the procedure's answer lies to those points, where that matters
+    std::vector<T_ADDITIONAL_STEP> additionalSteps;
+    std::vector<T_ADDITIONAL_POINT> additionalPoints;
 
     std::optional<T_BILINEAR> bilinear;
     std::vector<T_TARGET_DISP> targets; // one; NTC: SLO, SLD, SLV, SLC

@@ -10,16 +10,6 @@ double At(double x, double x0, double y0, double x1, double y1)
     return x1 == x0 ? y1 : y0 + (y1 - y0) * (x - x0) / (x1 - x0);
 }
 
-/// Sa on the curve at d, the last ordinate beyond it.
-double AccelAt(const T_ADRS_VIEW& c, double d)
-{
-    for (std::size_t i = 0; i + 1 < c.Size(); ++i) {
-        if (c.Sd[i] <= d && d <= c.Sd[i + 1])
-            return At(d, c.Sd[i], c.Sa[i], c.Sd[i + 1], c.Sa[i + 1]);
-    }
-    return c.Sa.back();
-}
-
 /// Displacement where the curve first reaches a level, walking up from the origin.
 double FirstReach(const T_ADRS_VIEW& c, double level)
 {
@@ -72,9 +62,17 @@ double CurveArea(const T_ADRS_VIEW& c, double d)
     return sum;
 }
 
-int CalcBilinearEc8(const T_ADRS_VIEW& curve, double dm, T_BILINEAR& out)
+double CurveAccelAt(const T_ADRS_VIEW& c, double d)
 {
-    const double ay = AccelAt(curve, dm);
+    for (std::size_t i = 0; i + 1 < c.Size(); ++i) {
+        if (c.Sd[i] <= d && d <= c.Sd[i + 1])
+            return At(d, c.Sd[i], c.Sa[i], c.Sd[i + 1], c.Sa[i + 1]);
+    }
+    return c.Sa.back();
+}
+
+int CalcBilinearEc8(const T_ADRS_VIEW& curve, double dm, double ay, T_BILINEAR& out)
+{
     if (!(ay > 0.0) || !(dm > 0.0)) return 0;
     const double dy = std::min(2.0 * (dm - CurveArea(curve, dm) / ay), dm);
     if (!(dy > 0.0)) return 0;

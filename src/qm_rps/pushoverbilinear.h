@@ -28,9 +28,13 @@ std::size_t FirstMaximum(const std::vector<double>& Sa);
 /// Area under a curve from its first point to d: whole trapezoids up to d, the last one cut.
 double CurveArea(const T_ADRS_VIEW& curve, double d);
 
-/// EN 1998-1 Annex B.3: equal energy up to dm, yield force = force at dm. `curve` starts at the
-/// origin. 1 done; 0 no yield point (no force, or more energy than a rectangle), output as it was.
-[[nodiscard]] int CalcBilinearEc8(const T_ADRS_VIEW& curve, double dm, T_BILINEAR& out);
+/// Sa on a curve at d: of the first segment that holds d, the last ordinate beyond the curve.
+double CurveAccelAt(const T_ADRS_VIEW& curve, double d);
+
+/// EN 1998-1 Annex B.3: equal energy up to dm, yield force = force at dm, which is `ay`. `curve`
+/// starts at the origin. 1 done; 0 no yield point (no force, or too little energy), output as it
+/// was.
+[[nodiscard]] int CalcBilinearEc8(const T_ADRS_VIEW& curve, double dm, double ay, T_BILINEAR& out);
 
 /// NTC C7.3.4.2: secant through a fraction of the peak, equal area to the displacement where the
 /// force has dropped. As above.

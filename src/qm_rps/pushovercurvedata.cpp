@@ -168,8 +168,9 @@ void CPushOverCurveData::CalcConversion()
         forceScale = std::fabs(m_factors.mass);
     else if (m_factors.gamma != 0.0)
         forceScale = std::fabs(m_factors.mass * m_factors.alpha) / std::fabs(m_factors.gamma);
-    m_conversionError = std::fabs(m_factors.gamma) < kNoParticipation || forceScale == 0.0 || m_factors.alpha == 0.0 ||
-                        !std::isfinite(m_factors.gamma) || !std::isfinite(forceScale);
+    m_conversionError = std::fabs(m_factors.gamma) < kNoParticipation || forceScale == 0.0 ||
+                        m_factors.alpha == 0.0 || !std::isfinite(m_factors.gamma) ||
+                        !std::isfinite(forceScale);
 }
 
 void CPushOverCurveData::TransformByPlotType(PLOT_TYPE type, double& displacement,

@@ -38,6 +38,7 @@ struct T_PUSH_CURVE_SETTINGS {
     double gravity = 9.80665; // current units
     double userWeight = 0.0;  // used where the model has no vertical mass, force unit
     std::array<double, 4> extraNodes{}; // further monitored nodes; numbers kept as reals
+    bool operator==(const T_PUSH_CURVE_SETTINGS&) const = default;
 };
 
 /// Factors between the multi- and the single-degree-of-freedom system.

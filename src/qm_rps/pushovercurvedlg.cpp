@@ -4,6 +4,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_db/filectrl.h"
+#include "qm_rps/pushoverallpoints.h"
 #include "qm_rps/pushovercalcperfptfema440proca.h"
 #include "qm_rps/pushovercalcperfptfema440procc.h"
 #include "qm_rps/pushovercalcperfptproca.h"
@@ -19,6 +20,14 @@ constexpr const char* kSource = "src/qm_rps/pushovercurvedlg";
 void Assert(int line)
 {
     if (CAppBase::IsReleaseAssert_ST()) CAppBase::ReleaseAssertion_ST(kSource, line);
+}
+
+/// How Gamma is defined: by the mode as recorded, from the nodal masses, or for NTC.
+const char* GammaKey(const T_EVAL_D& eval, const T_PUSH_FACTORS& factors)
+{
+    if (eval.method >= PUSH_METHOD::Ntc2008 && !factors.eigenBased)
+        return "IDS_RPS_PO_CURVE_GAMMA_NTC";
+    return factors.eigenBased ? "IDS_RPS_PO_CURVE_GAMMA_FEMA" : "IDS_RPS_PO_CURVE_GAMMA_2D_FEMA";
 }
 
 bool InUnitRange(const std::optional<double>& v)
@@ -106,15 +115,19 @@ int CPushOverCurveDlg::CalcPushoverCurve()
     settings.plotType = MethodPlotType();
     settings.eigenFactors = m_eval.eigenFactors.value_or(true);
     settings.gravity = GetGravity(1);
-    SetCapacity({});
-    if (!m_curve.Calc(settings)) {
+    const bool made = m_curveMade == settings && m_curveRevision == m_doc.Data().Revision();
+    m_curveMade.reset();
+    if (!made && !m_curve.Calc(settings)) {
+        SetCapacity({});
         m_result.outcome = {PUSH_OUTCOME::NoCapacity, 0};
         ShowMessage("IDS_QM_CURVE_NOT_READ",
                     zql::lib::MMSGFunction::Format("IDS_QM_CURVE_NOT_READ",
                                                    {m_eval.push, m_curve.Error()}));
         return 0;
     }
-    SetCapacity({m_curve.Displacement(), m_curve.Force()});
+    m_curveMade = settings;
+    m_curveRevision = m_doc.Data().Revision();
+    if (!made) SetCapacity({m_curve.Displacement(), m_curve.Force()});
     WarnAboutCurve();
     return CheckCurve();
 }
@@ -146,17 +159,31 @@ int CPushOverCurveDlg::Evaluate()
 {
     ClearMessages();
     ClearPerfPoint();
+    m_additionalSteps.Clear();
     m_result = {};
     m_result.eval = m_eval;
     m_result.procedure = m_eval.procedure.value_or('A');
     m_result.units = m_doc.Unit().Units();
     if (CalcPushoverCurve()) {
-        SetDesignSpectrum(
-            MakeDesignSpectrum(m_spectrumRecord, Damping().behaviorType, LIMIT_STATE::SLV));
+        PrepareSpectrum();
         m_result.result = m_result.IsTarget() ? UpdateTargetDispData() : UpdatePerformancePoint();
     }
     FillResult();
     return m_result.result;
+}
+
+// The spectrum of the record at its own damping; NTC gives the state SLV here.
+void CPushOverCurveDlg::PrepareSpectrum()
+{
+    const int behavior = Damping().behaviorType;
+    const double gravity = CPushOverPerfPtRecord::GetGravity(1);
+    if (m_spectrumMade == m_spectrumRecord && m_spectrumBehavior == behavior &&
+        m_spectrumGravity == gravity)
+        return;
+    SetDesignSpectrum(MakeDesignSpectrum(m_spectrumRecord, behavior, LIMIT_STATE::SLV));
+    m_spectrumMade = m_spectrumRecord;
+    m_spectrumBehavior = behavior;
+    m_spectrumGravity = gravity;
 }
 
 int CPushOverCurveDlg::UpdatePerformancePoint()
@@ -176,14 +203,13 @@ int CPushOverCurveDlg::UpdatePerformancePoint()
     m_result.outcome = calculator->Outcome();
     if (const auto* c = dynamic_cast<CPushOverCalcPerfPtFEMA440ProcC*>(calculator.get()))
         m_result.locus = c->Locus();
-    if (result == kPerfPtNone)
-        ShowMessage(failed);
-    else
-        KeepPoint(Dp, Ap, beta);
+    if (result == kPerfPtNone) ShowMessage(failed);
+    if (result != kPerfPtNone) m_result.point = MakePoint(Dp, Ap, beta);
+    if (m_findAllPoints) KeepAllPoints();
     return result;
 }
 
-void CPushOverCurveDlg::KeepPoint(double Dp, double Ap, std::optional<double> beta)
+T_PERF_POINT CPushOverCurveDlg::MakePoint(double Dp, double Ap, std::optional<double> beta) const
 {
     T_PERF_POINT p;
     p.Sd = p.D = Dp;
@@ -191,7 +217,66 @@ void CPushOverCurveDlg::KeepPoint(double Dp, double Ap, std::optional<double> be
     TransferToDispAndReac(&p.D, &p.V);
     p.Teff = 2.0 * std::acos(-1.0) * std::sqrt(Dp / (Ap * GetGravity(1)));
     p.damping = beta;
-    m_result.point = p;
+    return p;
+}
+
+// The procedure's answer stays as it is; the note says how it lies to the balanced points.
+void CPushOverCurveDlg::KeepAllPoints()
+{
+    constexpr double kAway = 0.02; // of the point's displacement
+    const bool fema440 = m_eval.method == PUSH_METHOD::Fema440;
+    for (const T_BALANCED_POINT& b : CPushOverAllPoints(*this, fema440).Find())
+        m_result.allPoints.push_back(MakePoint(b.Sd, b.Sa, b.betaEff));
+    if (m_result.allPoints.empty()) return;
+    using zql::lib::MMSGFunction;
+    if (!m_result.point) {
+        m_result.pointNote = MMSGFunction::Format(
+            "IDS_QM_POINT_EXISTS", {std::to_string(m_result.allPoints.size()),
+                                    FormatText("%.6g", m_result.allPoints.front().D)});
+        return;
+    }
+    const double D = m_result.point->D;
+    const auto nearest = std::ranges::min_element(
+        m_result.allPoints, {}, [D](const T_PERF_POINT& p) { return std::fabs(p.D - D); });
+    const double away = std::fabs(nearest->D - D) / nearest->D;
+    if (away > kAway)
+        m_result.pointNote =
+            MMSGFunction::Format("IDS_QM_POINT_AWAY", {FormatText("%.2g", 100.0 * away),
+                                                       FormatText("%.6g", nearest->D)});
+}
+
+int CPushOverCurveDlg::CalcAdditionalPerformancePoint(const std::string& spectrum)
+{
+    if (m_result.additionalPoints.size() >= kMaxAdditional) {
+        ShowMessage("IDS_RPS_PUSHOVER_Maxnum_reached");
+        return 0;
+    }
+    T_EVAL_D other = m_eval;
+    other.spectrum = spectrum;
+    CPushOverCurveDlg driver(m_doc);
+    driver.SetFindAllPoints(false);
+    if (m_result.IsTarget() || !driver.SetEvaluation(other)) return 0;
+    const int result = driver.Evaluate();
+    m_result.additionalPoints.push_back(
+        {spectrum, result, driver.Result().point, driver.Result().outcome});
+    return 1;
+}
+
+int CPushOverCurveDlg::OnPushoverCurveAddStep(int step)
+{
+    m_additionalSteps.SetStepCount(static_cast<int>(m_result.capacity.Sd.size()) - 1);
+    m_additionalSteps.ClearMessages();
+    if (!m_additionalSteps.AddStep(step)) {
+        for (const auto& m : m_additionalSteps.Messages())
+            ShowMessage(m.key, m.text);
+        return 0;
+    }
+    const auto i = static_cast<std::size_t>(step);
+    const double Sd = m_result.capacity.Sd[i], Sa = m_result.capacity.Sa[i];
+    T_ADDITIONAL_STEP row{step, Sd, Sa, Sd, Sa};
+    TransferToDispAndReac(&row.D, &row.V);
+    m_result.additionalSteps.push_back(row);
+    return 1;
 }
 
 T_BILINEAR_OPTIONS CPushOverCurveDlg::BilinearOptions() const
@@ -297,9 +382,29 @@ void CPushOverCurveDlg::FillResult()
     m_result.reduced = PerfPointSpectrum();
     m_result.working = WorkingDemand();
     if (m_result.locus.Sd.empty()) m_result.locus = PerfPointTrace();
+    m_result.gammaNote = zql::lib::MMSGFunction::GetValue(GammaKey(m_eval, m_result.factors));
+    KeepStateDemands();
     m_result.teffs = Teffs();
     PlotCurve();
     m_result.messages = Messages();
+}
+
+// NTC: one spectrum for each enabled limit state, for the picture.
+void CPushOverCurveDlg::KeepStateDemands()
+{
+    if (m_eval.method < PUSH_METHOD::Ntc2008 ||
+        !std::holds_alternative<T_SPFC_NTC>(m_spectrumRecord.data))
+        return;
+    m_result.stateDemands.resize(kLimitStateNames.size());
+    std::vector<double> T;
+    for (std::size_t i = 0; i < kLimitStateNames.size(); ++i) {
+        const auto spectrum = MakeDesignSpectrum(m_spectrumRecord, Damping().behaviorType,
+                                                 static_cast<LIMIT_STATE>(i));
+        if (!spectrum) continue;
+        T_ADRS_CURVE& curve = m_result.stateDemands[i];
+        spectrum->CalcPOSpectrumSRaSRv(1.0, 1.0, T, curve.Sa);
+        ToAdrs(T, curve.Sa, curve.Sd);
+    }
 }
 
 // The curve that the report tabulates: the method's own, or of the plot type asked for.

@@ -5,6 +5,7 @@
 #pragma once
 
 #include "qm_rps/pushevaluation.h"
+#include "qm_rps/pushoveradditionalstepdlg.h"
 #include "qm_rps/pushovercalcperfptbase.h"
 #include "qm_rps/pushovertargetevaluation.h"
 
@@ -33,6 +34,16 @@ public:
     /// Whether limit-state steps are stored in the model (the default).
     void SetStoreSteps(bool store) { m_storeSteps = store; }
 
+    /// Whether every point where demand equals capacity is looked for (the default).
+    void SetFindAllPoints(bool find) { m_findAllPoints = find; }
+
+    /// Performance point of the same evaluation with another spectrum, kept with the result. At
+    /// most 10 (IDS_RPS_PUSHOVER_Maxnum_reached). 1 kept; 0 full, no such spectrum, or no
+    /// performance-point method.
+    [[nodiscard]] int CalcAdditionalPerformancePoint(const std::string& spectrum);
+    /// Lists a step beside the result; see CPushOverAdditionalStepDlg::AddStep. After Evaluate.
+    [[nodiscard]] int OnPushoverCurveAddStep(int step);
+
     /// Reads the result steps and builds the capacity spectrum. 1 done; 0 the outcome says why.
     [[nodiscard]] int CalcPushoverCurve();
 
@@ -59,7 +70,10 @@ private:
     T_BILINEAR_OPTIONS BilinearOptions() const;
     std::optional<double> DriftOfStep(int step);
     void StoreSteps(const CPushOverTargetEvaluation& evaluation);
-    void KeepPoint(double Dp, double Ap, std::optional<double> beta);
+    T_PERF_POINT MakePoint(double Dp, double Ap, std::optional<double> beta) const;
+    void KeepAllPoints();
+    void PrepareSpectrum();
+    void KeepStateDemands();
     int CheckCurve();
     void WarnAboutCurve();
     void FillResult();
@@ -72,8 +86,16 @@ private:
     T_SPFC_D m_spectrumRecord;
     int m_pushover = 0;
     bool m_storeSteps = true;
+    bool m_findAllPoints = true;
     bool m_driftMissing = false;
     CPushOverCurveData m_curve;
+    CPushOverAdditionalStepDlg m_additionalSteps;
+    // What the curve and the spectrum at hand were made from; both are kept while that stands.
+    std::optional<T_PUSH_CURVE_SETTINGS> m_curveMade;
+    long m_curveRevision = -1;
+    std::optional<T_SPFC_D> m_spectrumMade;
+    int m_spectrumBehavior = -1;
+    double m_spectrumGravity = 0.0;
     T_PUSH_EVALUATION m_result;
     std::string m_settingsError;
 };

@@ -47,27 +47,34 @@ T_TARGET_DISP CPushOverTargetEvaluation::CalcTarget(const T_TARGET_SPECTRUM& spe
 int CPushOverTargetEvaluation::IterateBilinear()
 {
     const T_ADRS_VIEW curve = m_fromOrigin.View();
-    double dm = curve.Sd[FirstMaximum(m_fromOrigin.Sa)];
-    T_BILINEAR b;
-    if (!CalcBilinearEc8(curve, dm, b)) return 0;
-    m_bilinear = b;
-    m_fits = 1;
+    const std::size_t peak = FirstMaximum(m_fromOrigin.Sa);
+    double dm = curve.Sd[peak];
+    if (!FitEc8(dm, curve.Sa[peak])) return 0;
     while (m_in.options.iterate && m_in.spectra[0].SaAt && m_fits <= kMaxFits) {
         const T_TARGET_DISP t = CalcTarget(m_in.spectra[0], true);
         if (!t.found) break;
         const double next = std::min(t.dt, curve.Sd.back());
         if (std::fabs(next - dm) < kSameDm * std::fabs(next)) break;
         dm = next;
-        if (!CalcBilinearEc8(curve, dm, b)) return 0;
-        m_bilinear = b;
-        ++m_fits;
+        if (!FitEc8(dm, CurveAccelAt(curve, dm))) return 0;
     }
+    return 1;
+}
+
+int CPushOverTargetEvaluation::FitEc8(double dm, double ay)
+{
+    m_bilinear.reset();
+    T_BILINEAR b;
+    if (!CalcBilinearEc8(m_fromOrigin.View(), dm, ay, b)) return 0;
+    m_bilinear = b;
+    ++m_fits;
     return 1;
 }
 
 int CPushOverTargetEvaluation::CalcBilinear()
 {
     m_bilinear.reset();
+    m_fits = 0;
     m_outcome = {PUSH_OUTCOME::BilinearTooShort, 0};
     if (m_in.capacity.Sd.size() < 2) return 0;
     if (m_in.options.rule == BILINEAR_RULE::Ec8) return IterateBilinear();

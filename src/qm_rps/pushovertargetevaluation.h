@@ -45,6 +45,7 @@ public:
 private:
     int CalcBilinear();
     int IterateBilinear();
+    int FitEc8(double dm, double ay);
     T_TARGET_DISP CalcTarget(const T_TARGET_SPECTRUM& spectrum, bool capAt3) const;
     void FindDlSdNcSteps(std::span<const double> demands) { FindSteps(demands); }
     void FindNTC2008Steps(std::span<const double> demands) { FindSteps(demands); }

@@ -3,6 +3,7 @@
 #include "qm_base/textformat.h"
 
 #include <algorithm>
+#include <array>
 #include <cmath>
 
 namespace {
@@ -32,6 +33,21 @@ void AddCurve(T_PLOT& plot, const char* name, const T_ADRS_CURVE& c, PLOT_LINE l
     s.color = color;
     s.marker = marker;
     plot.series.push_back(std::move(s));
+}
+
+/// The elastic demand; for NTC one curve for each enabled limit state.
+void AddDemands(T_PLOT& plot, const T_PUSH_EVALUATION& e)
+{
+    if (e.stateDemands.empty()) {
+        AddCurve(plot, "Elastic demand", e.demand, PLOT_LINE::Solid, 1.6, kBlue);
+        return;
+    }
+    constexpr std::array<PLOT_LINE, 4> kLines{PLOT_LINE::Dot, PLOT_LINE::DashDot, PLOT_LINE::Dash,
+                                              PLOT_LINE::Solid};
+    for (std::size_t i = 0; i < e.stateDemands.size(); ++i) {
+        const std::string name = std::string("Elastic demand ") + kLimitStateNames[i];
+        AddCurve(plot, name.c_str(), e.stateDemands[i], kLines[i], 1.6, kBlue);
+    }
 }
 
 void AddRadial(T_PLOT& plot, const char* what, double T, double gravity)
@@ -79,6 +95,26 @@ void AddPoint(T_PLOT& plot, const T_PUSH_EVALUATION& e)
          PLOT_MARKER::Circle, true});
 }
 
+/// Other points where demand equals capacity, additional steps and points.
+void AddExtras(T_PLOT& plot, const T_PUSH_EVALUATION& e)
+{
+    const auto isAnswer = [&](const T_PERF_POINT& p) {
+        return e.point && std::fabs(p.Sd - e.point->Sd) <= 0.02 * p.Sd;
+    };
+    for (const T_PERF_POINT& p : e.allPoints) {
+        if (!isAnswer(p))
+            plot.labels.push_back({p.Sd, p.Sa, "demand = capacity", PLOT_MARKER::Triangle, false});
+    }
+    for (const T_ADDITIONAL_STEP& s : e.additionalSteps)
+        plot.labels.push_back(
+            {s.Sd, s.Sa, FormatText("step %d", s.step), PLOT_MARKER::Plus, false});
+    for (const T_ADDITIONAL_POINT& p : e.additionalPoints) {
+        if (p.point)
+            plot.labels.push_back(
+                {p.point->Sd, p.point->Sa, p.spectrum, PLOT_MARKER::Cross, false});
+    }
+}
+
 void AddTargets(T_PLOT& plot, const T_PUSH_EVALUATION& e)
 {
     if (e.bilinear) {
@@ -113,6 +149,10 @@ void SetRanges(T_PLOT& plot, const T_PUSH_EVALUATION& e)
         x = std::max(x, g.Sd);
     for (const double a : e.demand.Sa)
         y = std::max(y, a);
+    for (const T_ADRS_CURVE& c : e.stateDemands) {
+        for (const double a : c.Sa)
+            y = std::max(y, a);
+    }
     if (x > 0.0 && y > 0.0) {
         plot.x.range = T_PLOT_RANGE{0.0, 1.12 * x};
         plot.y.range = T_PLOT_RANGE{0.0, 1.1 * y};
@@ -149,7 +189,7 @@ T_PLOT EvaluationPlot(const T_PUSH_EVALUATION& e)
                     e.eval.push + ", spectrum " + e.eval.spectrum;
     plot.x.title = "Spectral displacement Sd (" + LengthUnit(e) + ")";
     plot.y.title = "Spectral acceleration Sa (g)";
-    AddCurve(plot, "Elastic demand", e.demand, PLOT_LINE::Solid, 1.6, kBlue);
+    AddDemands(plot, e);
     AddCurve(plot, "Working demand of the last trial", e.working, PLOT_LINE::DashDot, 1.4, kGray);
     AddCurve(plot, "Reduced demand", e.reduced, PLOT_LINE::Dash, 1.8, kRed);
     AddCurve(plot, "Capacity", e.capacity, PLOT_LINE::Solid, 2.6, kBlack);
@@ -158,6 +198,7 @@ T_PLOT EvaluationPlot(const T_PUSH_EVALUATION& e)
     AddTargets(plot, e);
     AddTrials(plot, e);
     AddPoint(plot, e);
+    AddExtras(plot, e);
     AddRadial(plot, "T0", PeriodOfFirstStep(e), e.factors.gravity);
     if (e.point) AddRadial(plot, "T_eff", e.point->Teff, e.factors.gravity);
     SetRanges(plot, e);

@@ -1,0 +1,83 @@
+#include "qm_ui/comparisonplot.h"
+
+#include "qm_base/textformat.h"
+
+#include <algorithm>
+
+namespace {
+
+T_PLOT_SERIES Curve(const char* name, const T_ADRS_CURVE& c, PLOT_LINE line, double width,
+                    T_PLOT_COLOR color)
+{
+    T_PLOT_SERIES s;
+    s.name = name;
+    s.x = c.Sd;
+    s.y = c.Sa;
+    s.line = line;
+    s.width = width;
+    s.color = color;
+    s.marker = PLOT_MARKER::None;
+    return s;
+}
+
+/// Performance points as circles, target displacements as squares.
+void AddRows(T_PLOT& plot, const T_PUSH_COMPARISON& c)
+{
+    for (std::size_t i = 0; i < c.rows.size(); ++i) {
+        const T_COMPARISON_ROW& row = c.rows[i];
+        if (!row.found) continue;
+        const bool target = c.results[i].IsTarget();
+        plot.labels.push_back(
+            {row.Sd, row.Sa, row.label, target ? PLOT_MARKER::Square : PLOT_MARKER::Circle, false});
+    }
+}
+
+void AddNotes(T_PLOT& plot, const T_PUSH_COMPARISON& c, const std::string& unit)
+{
+    for (const T_COMPARISON_ROW& row : c.rows)
+        plot.notes.push_back(
+            row.found ? FormatText("%s: D = %.4g %s", row.label.c_str(), row.D, unit.c_str())
+                      : row.label + ": " + OutcomeName(row.outcome));
+    if (c.count > 0)
+        plot.notes.push_back(FormatText("Spread of D: %.4g to %.4g %s, ratio %.3g", c.minD, c.maxD,
+                                        unit.c_str(), c.maxD / c.minD));
+}
+
+} // namespace
+
+T_PLOT ComparisonPlot(const T_PUSH_COMPARISON& c)
+{
+    T_PLOT plot;
+    if (c.results.empty()) return plot;
+    const T_PUSH_EVALUATION& first = c.results.front();
+    const std::string unit(NameOf(first.units.length));
+    plot.title = "All methods, pushover " + first.eval.push;
+    plot.subtitle = "Spectrum " + first.eval.spectrum +
+                    "; circles: performance points, squares: target displacements";
+    plot.x.title = "Spectral displacement Sd (" + unit + ")";
+    plot.y.title = "Spectral acceleration Sa (g)";
+    plot.series.push_back(
+        Curve("Elastic demand", first.demand, PLOT_LINE::Solid, 1.6, {20, 64, 140}));
+    plot.series.push_back(Curve("Capacity", first.capacity, PLOT_LINE::Solid, 2.6, {0, 0, 0}));
+    for (const T_PUSH_EVALUATION& e : c.results) {
+        if (e.eval.method != PUSH_METHOD::Ec8Opcm || !e.bilinear) continue;
+        const T_BILINEAR& b = *e.bilinear;
+        plot.series.push_back(Curve("Bilinear capacity (EC8)",
+                                    {{0.0, b.dy, b.du}, {0.0, b.ay, b.au}}, PLOT_LINE::DashDot, 1.6,
+                                    {20, 110, 60}));
+    }
+    AddRows(plot, c);
+    AddNotes(plot, c, unit);
+    double x = 0.0, y = 0.0;
+    for (const double d : first.capacity.Sd)
+        x = std::max(x, d);
+    for (const T_COMPARISON_ROW& row : c.rows)
+        x = std::max(x, row.Sd);
+    for (const double a : first.demand.Sa)
+        y = std::max(y, a);
+    if (x > 0.0 && y > 0.0) {
+        plot.x.range = T_PLOT_RANGE{0.0, 1.12 * x};
+        plot.y.range = T_PLOT_RANGE{0.0, 1.1 * y};
+    }
+    return plot;
+}
