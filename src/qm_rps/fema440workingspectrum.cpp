@@ -10,6 +10,7 @@ int CFema440WorkingSpectrum::ReduceByB(double B)
     for (std::size_t i = 0; i < Sa5.size(); ++i)
         m_curve.Sa[i] = Sa5[i] / B;
     m_owner.ToAdrs(m_owner.DemandPeriods(), m_curve.Sa, m_curve.Sd);
+    m_isReduced = true;
     return 1;
 }
 
@@ -21,7 +22,7 @@ void CFema440WorkingSpectrum::Modify(double M)
 
 int CFema440WorkingSpectrum::OnRadialLine(double D, double A, double& Ds, double& As) const
 {
-    const auto point = CCurveCrossing::HalfLine({D, A}, m_curve.View());
+    const auto point = CCurveCrossing::HalfLine({D, A}, Curve().View());
     if (!point) return 0;
     Ds = point->x;
     As = point->y;

@@ -3,6 +3,7 @@
 #include "qm_base/textformat.h"
 
 #include <algorithm>
+#include <vector>
 
 namespace {
 
@@ -20,15 +21,24 @@ T_PLOT_SERIES Curve(const char* name, const T_ADRS_CURVE& c, PLOT_LINE line, dou
     return s;
 }
 
-/// Performance points as circles, target displacements as squares.
-void AddRows(T_PLOT& plot, const T_PUSH_COMPARISON& c)
+/// Performance points as circles, target displacements as squares. Points that lie closer than
+/// 2 % of the picture share one label.
+void AddRows(T_PLOT& plot, const T_PUSH_COMPARISON& c, double width)
 {
+    std::vector<std::size_t> order;
     for (std::size_t i = 0; i < c.rows.size(); ++i) {
-        const T_COMPARISON_ROW& row = c.rows[i];
-        if (!row.found) continue;
-        const bool target = c.results[i].IsTarget();
-        plot.labels.push_back(
-            {row.Sd, row.Sa, row.label, target ? PLOT_MARKER::Square : PLOT_MARKER::Circle, false});
+        if (c.rows[i].found) order.push_back(i);
+    }
+    std::ranges::stable_sort(order, {}, [&](std::size_t i) { return c.rows[i].Sd; });
+    std::size_t head = 0; // label that the point at hand may join
+    for (std::size_t k = 0; k < order.size(); ++k) {
+        const T_COMPARISON_ROW& row = c.rows[order[k]];
+        const PLOT_MARKER marker =
+            c.results[order[k]].IsTarget() ? PLOT_MARKER::Square : PLOT_MARKER::Circle;
+        const bool joins = k > 0 && row.Sd - plot.labels[head].x < 0.02 * width;
+        if (joins) plot.labels[head].text += "\n" + row.label;
+        if (!joins) head = plot.labels.size();
+        plot.labels.push_back({row.Sd, row.Sa, joins ? std::string() : row.label, marker, false});
     }
 }
 
@@ -66,7 +76,6 @@ T_PLOT ComparisonPlot(const T_PUSH_COMPARISON& c)
                                     {{0.0, b.dy, b.du}, {0.0, b.ay, b.au}}, PLOT_LINE::DashDot, 1.6,
                                     {20, 110, 60}));
     }
-    AddRows(plot, c);
     AddNotes(plot, c, unit);
     double x = 0.0, y = 0.0;
     for (const double d : first.capacity.Sd)
@@ -75,6 +84,7 @@ T_PLOT ComparisonPlot(const T_PUSH_COMPARISON& c)
         x = std::max(x, row.Sd);
     for (const double a : first.demand.Sa)
         y = std::max(y, a);
+    AddRows(plot, c, x);
     if (x > 0.0 && y > 0.0) {
         plot.x.range = T_PLOT_RANGE{0.0, 1.12 * x};
         plot.y.range = T_PLOT_RANGE{0.0, 1.1 * y};
