@@ -2,6 +2,7 @@
 #include "commands.h"
 #include "qm_base/msgfunction.h"
 #include "qm_rps/pushoverreport.h"
+#include "verify.h"
 
 #include <CLI/CLI.hpp>
 
@@ -78,6 +79,16 @@ void AddCompare(CLI::App& app, EXIT_CODE& code)
     sub->callback([=, &code] { code = RunCompare(*o); });
 }
 
+void AddVerify(CLI::App& app, EXIT_CODE& code)
+{
+    auto* sub =
+        app.add_subcommand("verify", "Compare the verification cases with their references");
+    auto folder = std::make_shared<std::string>();
+    sub->add_option("FOLDER", *folder, "Folder with checks.json and its case files")->required();
+    sub->footer("Example:\n  qm-rps verify examples/verification");
+    sub->callback([=, &code] { code = RunVerify(*folder); });
+}
+
 } // namespace
 
 int main(int argc, char** argv)
@@ -101,6 +112,7 @@ int main(int argc, char** argv)
     AddInfo(app, code);
     AddEvaluate(app, code);
     AddCompare(app, code);
+    AddVerify(app, code);
     try {
         app.parse(argc, argv);
     } catch (const CLI::ParseError& e) {
