@@ -28,6 +28,15 @@ EXIT_CODE Complain(EXIT_CODE code, const std::string& text)
     return code;
 }
 
+/// Whether the name ends in a picture format; a message where it does not.
+EXIT_CODE CheckPlotName(const std::string& path)
+{
+    for (const char* extension : {".svg", ".png", ".pdf"}) {
+        if (path.empty() || path.ends_with(extension)) return EXIT_CODE::Done;
+    }
+    return Complain(EXIT_CODE::Usage, path + ": a picture is .svg, .png or .pdf");
+}
+
 /// Additional steps and spectra; false after a message on stderr.
 bool AddExtras(CPushOverCurveDlg& driver, const T_EVALUATE_OPTIONS& options)
 {
@@ -184,6 +193,7 @@ EXIT_CODE RunInfo(const std::string& file, bool check)
 
 EXIT_CODE RunCompare(const T_COMPARE_OPTIONS& o)
 {
+    if (const EXIT_CODE code = CheckPlotName(o.plot); code != EXIT_CODE::Done) return code;
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     T_PUSH_COMPARISON comparison;
@@ -206,6 +216,7 @@ EXIT_CODE RunCompare(const T_COMPARE_OPTIONS& o)
 
 EXIT_CODE RunEvaluate(const T_EVALUATE_OPTIONS& o)
 {
+    if (const EXIT_CODE code = CheckPlotName(o.plot); code != EXIT_CODE::Done) return code;
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     std::vector<T_PUSH_EVALUATION> results;

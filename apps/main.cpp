@@ -6,6 +6,9 @@
 
 #include <CLI/CLI.hpp>
 
+#include <csignal>
+#include <cstdio>
+
 namespace {
 
 void AddImport(CLI::App& app, EXIT_CODE& code)
@@ -94,6 +97,7 @@ void AddVerify(CLI::App& app, EXIT_CODE& code)
 int main(int argc, char** argv)
 {
     CLI::App app{"Pushover evaluation: performance points and target displacements", "qm-rps"};
+    std::signal(SIGXFSZ, SIG_IGN); // a file-size limit is a write error, not the end
     EXIT_CODE code = EXIT_CODE::Done;
     std::string language = "en";
     app.set_version_flag("--version", ProductText());
@@ -116,7 +120,9 @@ int main(int argc, char** argv)
     try {
         app.parse(argc, argv);
     } catch (const CLI::ParseError& e) {
-        return app.exit(e) == 0 ? ToInt(EXIT_CODE::Done) : ToInt(EXIT_CODE::Usage);
+        if (e.get_exit_code() == 0) return app.exit(e); // --help, --version
+        std::fprintf(stderr, "qm-rps: %s (see qm-rps --help)\n", e.what());
+        return ToInt(EXIT_CODE::Usage);
     }
     return ToInt(code);
 }

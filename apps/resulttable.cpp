@@ -77,6 +77,25 @@ std::string AdditionalLines(const T_PUSH_EVALUATION& e, int width)
     return text;
 }
 
+std::string TrialLines(const T_PUSH_EVALUATION& e)
+{
+    const char* const format =
+        "  %5s %10s %10s %10s %10s %9s %9s %8s %9s %8s %8s %9s %9s %10s %10s";
+    std::string text = FormatText(format, "trial", "dpi", "api", "dy", "ay", "alpha", "mu", "kappa",
+                                  "beta_eff", "SRa", "SRv", "T_eff", "M", "Di", "Ai") +
+                       "\n";
+    for (const T_PERFPT_TRIAL& t : e.trace) {
+        text += FormatText(format, std::to_string(t.trial).c_str(), Number(t.dpi).c_str(),
+                           Number(t.api).c_str(), Number(t.dy).c_str(), Number(t.ay).c_str(),
+                           Number(t.alpha).c_str(), Number(t.mu).c_str(), Number(t.kappa).c_str(),
+                           Number(t.betaEff).c_str(), Number(t.SRa).c_str(), Number(t.SRv).c_str(),
+                           Number(t.Teff).c_str(), Number(t.M).c_str(), Number(t.Di).c_str(),
+                           Number(t.Ai).c_str());
+        text += t.row ? "  " + Fema440RowText(*t.row) + "\n" : "\n";
+    }
+    return text;
+}
+
 } // namespace
 
 std::string ResultTable(const std::vector<T_PUSH_EVALUATION>& results)
@@ -130,21 +149,9 @@ std::string ComparisonTable(const T_PUSH_COMPARISON& c)
 
 std::string TraceTable(const T_PUSH_EVALUATION& e)
 {
-    std::string text = FormatText("\n%s: trials\n", e.eval.name.c_str());
-    const char* const format =
-        "  %5s %10s %10s %10s %10s %9s %9s %8s %9s %8s %8s %9s %9s %10s %10s";
-    text += FormatText(format, "trial", "dpi", "api", "dy", "ay", "alpha", "mu", "kappa",
-                       "beta_eff", "SRa", "SRv", "T_eff", "M", "Di", "Ai") +
-            "\n";
-    for (const T_PERFPT_TRIAL& t : e.trace) {
-        text += FormatText(format, std::to_string(t.trial).c_str(), Number(t.dpi).c_str(),
-                           Number(t.api).c_str(), Number(t.dy).c_str(), Number(t.ay).c_str(),
-                           Number(t.alpha).c_str(), Number(t.mu).c_str(), Number(t.kappa).c_str(),
-                           Number(t.betaEff).c_str(), Number(t.SRa).c_str(), Number(t.SRv).c_str(),
-                           Number(t.Teff).c_str(), Number(t.M).c_str(), Number(t.Di).c_str(),
-                           Number(t.Ai).c_str());
-        text += t.row ? "  " + Fema440RowText(*t.row) + "\n" : "\n";
-    }
+    std::string text =
+        FormatText("\n%s: %s\n", e.eval.name.c_str(), e.IsTarget() ? "derivation" : "trials");
+    if (!e.IsTarget()) text += TrialLines(e);
     for (std::size_t i = 0; i < e.targets.size(); ++i) {
         const T_TARGET_DISP& t = e.targets[i];
         text +=
