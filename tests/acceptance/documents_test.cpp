@@ -1,0 +1,125 @@
+// Commands that help texts and documents show must work as they stand.
+#include "program.h"
+
+#include <gtest/gtest.h>
+
+namespace fs = std::filesystem;
+
+namespace {
+
+constexpr const char* kProgram = "qm-rps ";
+
+std::string Trimmed(const std::string& text)
+{
+    const auto from = text.find_first_not_of(' ');
+    return from == std::string::npos ? "" : text.substr(from);
+}
+
+/// A folder that sees the examples as the project's root does, and where commands may write.
+class Documents : public testing::Test {
+protected:
+    void SetUp() override
+    {
+        for (const char* name : {"examples", "tests"})
+            fs::create_directory_symlink(ProjectFolder() / name, m_root.Path() / name);
+    }
+    void ExpectWorks(const std::string& command, const std::string& where) const
+    {
+        const T_RUN run = RunShell(command, m_root.Path());
+        EXPECT_TRUE(run.code == 0 || run.code == 1) << where << ": " << command << "\n" << run.err;
+        EXPECT_EQ("", run.err) << where << ": " << command;
+        EXPECT_NE("", run.out) << where << ": " << command;
+    }
+    /// Runs the indented lines that start with the program's name; returns how many there are.
+    std::size_t RunCommandsOf(const fs::path& page) const
+    {
+        std::size_t count = 0;
+        for (const std::string& line : Lines(ReadText(page))) {
+            const std::string command = Trimmed(line);
+            if (!line.starts_with("    ") || !command.starts_with(kProgram)) continue;
+            ExpectWorks(command, page.filename().string());
+            ++count;
+        }
+        return count;
+    }
+    CTempFolder m_root;
+};
+
+/// The names that the program's own help lists under "Subcommands:".
+std::vector<std::string> CommandNames()
+{
+    std::vector<std::string> names;
+    bool listed = false;
+    for (const std::string& line : Lines(RunProgram({"--help"}).out)) {
+        if (listed && !line.starts_with("  ")) break;
+        if (listed) names.push_back(line.substr(2, line.find(' ', 2) - 2));
+        listed = listed || line.starts_with("Subcommands:");
+    }
+    return names;
+}
+
+TEST_F(Documents, EveryHelpHasAnExampleThatWorks)
+{
+    std::vector<std::vector<std::string>> commands{{}};
+    for (const std::string& name : CommandNames())
+        commands.push_back({name});
+    ASSERT_GE(commands.size(), 5U);
+    for (std::vector<std::string> arguments : commands) {
+        arguments.push_back("--help");
+        const T_RUN help = RunProgram(arguments);
+        ASSERT_EQ(0, help.code) << arguments.front();
+        const std::vector<std::string> lines = Lines(help.out);
+        std::size_t examples = 0;
+        for (std::size_t i = 0; i + 1 < lines.size(); ++i) {
+            if (Trimmed(lines[i]).rfind("Example:", 0) != 0) continue;
+            const std::string command = Trimmed(lines[i + 1]);
+            EXPECT_TRUE(command.starts_with(kProgram)) << command;
+            ExpectWorks(command, "help of " + arguments.front());
+            ++examples;
+        }
+        EXPECT_EQ(1U, examples) << help.out;
+    }
+}
+
+TEST_F(Documents, EveryCommandOfTheDocumentsWorks)
+{
+    std::size_t count = RunCommandsOf(ProjectFolder() / "README.md");
+    EXPECT_GE(count, 3U) << "README.md";
+    for (const auto& entry : fs::directory_iterator(ProjectFolder() / "docs"))
+        count += RunCommandsOf(entry.path());
+    EXPECT_GE(count, 10U);
+}
+
+TEST_F(Documents, EveryCommandOfTheExamplesWorks)
+{
+    std::size_t count = 0, pages = 0;
+    for (const auto& entry : fs::recursive_directory_iterator(ProjectFolder() / "examples")) {
+        if (entry.path().filename() != "README.md") continue;
+        count += RunCommandsOf(entry.path());
+        ++pages;
+    }
+    EXPECT_GE(pages, 6U);
+    EXPECT_GE(count, 2 * (pages - 1));
+}
+
+TEST_F(Documents, EveryLinkToAFileLeadsToOne)
+{
+    std::vector<fs::path> pages{ProjectFolder() / "README.md", ProjectFolder() / "CONTRIBUTING.md",
+                                ProjectFolder() / "examples/README.md"};
+    for (const auto& entry : fs::directory_iterator(ProjectFolder() / "docs"))
+        pages.push_back(entry.path());
+    std::size_t count = 0;
+    for (const fs::path& page : pages) {
+        const std::string text = ReadText(page);
+        for (auto at = text.find("]("); at != std::string::npos; at = text.find("](", at + 1)) {
+            std::string target = text.substr(at + 2, text.find(')', at) - at - 2);
+            target = target.substr(0, target.find('#'));
+            if (target.empty() || target.find("://") != std::string::npos) continue;
+            EXPECT_TRUE(fs::exists(page.parent_path() / target)) << page << ": " << target;
+            ++count;
+        }
+    }
+    EXPECT_GE(count, 10U);
+}
+
+} // namespace

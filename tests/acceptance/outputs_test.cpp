@@ -1,0 +1,232 @@
+// The files that evaluate writes: JSON, report, curve table, pictures.
+#include "program.h"
+
+#include <gtest/gtest.h>
+#include <nlohmann/json.hpp>
+#include <set>
+
+namespace {
+
+using json = nlohmann::json;
+const char* const kOne = "PX ATC-40 A";
+
+TEST(Outputs, JsonOnStandardOutputIsTheFileAndNothingElse)
+{
+    const CTempFolder folder;
+    const std::string file = ExampleCase("first-steps");
+    const T_RUN toFile = RunProgram({"evaluate", file, "--json", folder / "o.json"});
+    const T_RUN toOut = RunProgram({"evaluate", file, "--json", "-"});
+    ASSERT_EQ(0, toFile.code) << toFile.err;
+    ASSERT_EQ(0, toOut.code) << toOut.err;
+    EXPECT_EQ(ReadText(folder / "o.json"), toOut.out);
+    EXPECT_FALSE(toFile.out.empty());
+}
+
+TEST(Outputs, JsonHasTheDocumentedKeysAndNoOthers)
+{
+    const std::set<std::string> kKeys{
+        "name",   "push",         "method",  "procedure", "status", "factors", "capacity",
+        "target", "limit_states", "outcome", "messages",  "trials", "trace",   "performance_point"};
+    const json all =
+        json::parse(RunProgram({"evaluate", ExampleCase("first-steps"), "--json", "-"}).out);
+    ASSERT_EQ(8U, all.size());
+    const std::string page = ReadText(ProjectFolder() / "docs/file-formats.md");
+    for (const json& r : all) {
+        std::set<std::string> keys;
+        for (const auto& item : r.items())
+            keys.insert(item.key());
+        EXPECT_EQ(r.at("trials") != 0, keys.erase("all_points") == 1) << r.at("name");
+        EXPECT_EQ(kKeys, keys) << r.at("name");
+        const json flat = r.flatten();
+        for (const auto& part : flat.items()) {
+            const std::string path = part.key();
+            const std::string key = path.substr(path.rfind('/') + 1);
+            if (key.find_first_not_of("0123456789") == std::string::npos) continue;
+            EXPECT_NE(std::string::npos, page.find("`" + key + "`"))
+                << key << " is not in docs/file-formats.md";
+        }
+    }
+}
+
+TEST(Outputs, OnlyRunsTheEvaluationOfThatName)
+{
+    const T_RUN run =
+        RunProgram({"evaluate", ExampleCase("first-steps"), "--only", kOne, "--json", "-"});
+    const json all = json::parse(run.out);
+    ASSERT_EQ(1U, all.size());
+    EXPECT_EQ(kOne, all[0].at("name"));
+}
+
+TEST(Outputs, AdditionalStepsAndSpectraStandBesideTheResult)
+{
+    const std::vector<std::string> plain{
+        "evaluate", ExampleCase("first-steps"), "--only", kOne, "--json", "-"};
+    std::vector<std::string> more = plain;
+    more.insert(more.end(), {"--add-step", "20", "--add-spectrum", "EC8"});
+    const json a = json::parse(RunProgram(plain).out)[0], b = json::parse(RunProgram(more).out)[0];
+    EXPECT_EQ(a.at("performance_point"), b.at("performance_point"));
+    const json& step = b.at("additional_steps").at(0); // D = 0.036 + 0.0048 (20 - 10)
+    EXPECT_EQ(20, step.at("step"));
+    EXPECT_NEAR(0.084, step.at("D"), 1e-12);
+    EXPECT_NEAR(768.0, step.at("V"), 1e-9);
+    const json& point = b.at("additional_points").at(0);
+    EXPECT_EQ("EC8", point.at("spectrum"));
+    EXPECT_EQ("found", point.at("status"));
+    EXPECT_NE(a.at("performance_point").at("Sd"), point.at("performance_point").at("Sd"));
+    more.back() = "no such spectrum";
+    EXPECT_EQ(2, RunProgram(more).code);
+    more[more.size() - 3] = "41"; // the push has 40 steps
+    EXPECT_EQ(2, RunProgram(more).code);
+}
+
+TEST(Outputs, CompareListsEveryMethodWithTheSpread)
+{
+    const CTempFolder folder;
+    const std::string file = ExampleCase("first-steps");
+    const T_RUN run = RunProgram(
+        {"compare", file, "--push", "PX", "--spectrum", "ATC", "--json", folder / "c.json"});
+    ASSERT_EQ(0, run.code) << run.err;
+    for (const char* text : {"ATC-40 A", "ATC-40 B", "FEMA440 A", "FEMA440 B", "FEMA440 C",
+                             "EC8 SD", "NTC2008 SLV", "NTC2018 SLV", "spread of D over 8 methods"})
+        EXPECT_NE(std::string::npos, run.out.find(text)) << text;
+    const json compared = json::parse(ReadText(folder / "c.json"));
+    const json alone =
+        json::parse(RunProgram({"evaluate", file, "--only", kOne, "--json", "-"}).out);
+    EXPECT_EQ(alone[0].at("performance_point"), compared.at(0).at("performance_point"));
+    EXPECT_EQ(2, RunProgram({"compare", file, "--push", "PX", "--spectrum", "none"}).code);
+    EXPECT_EQ(2, RunProgram({"compare", file, "--push", "none", "--spectrum", "ATC"}).code);
+}
+
+TEST(Outputs, TraceHasOneLinePerTrial)
+{
+    const T_RUN run =
+        RunProgram({"evaluate", ExampleCase("first-steps"), "--only", kOne, "--trace"});
+    const auto from = run.out.find("PX ATC-40 A: trials");
+    ASSERT_NE(std::string::npos, from) << run.out;
+    const std::vector<std::string> lines = Lines(run.out.substr(from));
+    ASSERT_EQ(4U, lines.size()); // title, column names, two trials
+    EXPECT_NE(std::string::npos, lines[2].find("36.363")) << lines[2];
+    EXPECT_NE(std::string::npos, lines[3].find("34.653")) << lines[3];
+}
+
+TEST(Outputs, ReportHasItsSectionsAndTheNumbersOfTheJson)
+{
+    const CTempFolder folder;
+    const T_RUN run =
+        RunProgram({"evaluate", ExampleCase("first-steps"), "--only", kOne, "--report",
+                    folder / "r.txt", "--curve", folder / "c.txt", "--json", folder / "r.json"});
+    ASSERT_EQ(0, run.code) << run.err;
+    const std::string report = ReadText(folder / "r.txt"), curve = ReadText(folder / "c.txt");
+    const json point = json::parse(ReadText(folder / "r.json"))[0].at("performance_point");
+    for (const std::string& text :
+         {std::string("qm_rps 0.1.0"), std::string("[ Performance Point ]"),
+          std::string("Disp. Control Node : 4"), std::string("Direction : DX"),
+          "* V, D : " + std::to_string(point.at("V").get<double>()) + ", " +
+              std::to_string(point.at("D").get<double>()),
+          std::string("Gamma : 1.28571"), std::string("m* : 200")})
+        EXPECT_NE(std::string::npos, report.find(text)) << text;
+    EXPECT_TRUE(report.ends_with(curve)) << "the report ends with the curve table";
+    std::size_t rows = 0;
+    for (const std::string& line : Lines(curve))
+        rows += line.find("e-0") != std::string::npos && line.find(':') == std::string::npos;
+    EXPECT_EQ(41U, rows); // steps 0 to 40
+}
+
+TEST(Outputs, ReportsOfSeveralEvaluationsFollowOneAnother)
+{
+    const CTempFolder folder;
+    ASSERT_EQ(
+        0,
+        RunProgram({"evaluate", ExampleCase("first-steps"), "--report", folder / "all.txt"}).code);
+    std::size_t heads = 0;
+    for (const std::string& line : Lines(ReadText(folder / "all.txt")))
+        heads += line.starts_with("qm_rps ");
+    EXPECT_EQ(8U, heads);
+}
+
+TEST(Outputs, ItalianMessagesWithTheSameNumbers)
+{
+    const std::string file = ExampleCase("first-steps");
+    const std::string en = RunProgram({"evaluate", file}).out;
+    const T_RUN it = RunProgram({"--lang", "it", "evaluate", file});
+    EXPECT_EQ(0, it.code);
+    EXPECT_NE(en, it.out);
+    EXPECT_EQ(Lines(en)[1], Lines(it.out)[1]); // the line of the first point
+}
+
+#ifdef QM_UI
+
+/// What stands between tags: the words of an SVG picture.
+std::string Words(const std::string& svg)
+{
+    std::string words;
+    bool tag = false;
+    for (const char c : svg) {
+        if (c == '<') tag = true;
+        if (!tag && c != '\n') words += c;
+        if (c == '>') {
+            tag = false;
+            words += ' ';
+        }
+    }
+    return words;
+}
+
+TEST(Outputs, PictureHasTitleAxesLegendAndPoint)
+{
+    const CTempFolder folder;
+    const T_RUN run = RunProgram(
+        {"evaluate", ExampleCase("first-steps"), "--only", kOne, "--plot", folder / "p.svg"});
+    ASSERT_EQ(0, run.code) << run.err;
+    EXPECT_EQ("", run.err);
+    const std::string svg = ReadText(folder / "p.svg");
+    EXPECT_TRUE(svg.starts_with("<?xml"));
+    const std::string words = Words(svg);
+    for (const char* text :
+         {kOne, "Spectral displacement Sd (m)", "Spectral acceleration Sa (g)", "Elastic demand",
+          "Reduced demand", "Capacity", "Trial points", "Performance point", "Sd = 0.07752 m",
+          "T_eff = 1.00", "T0 = 0.628 s", "Outcome: converged"})
+        EXPECT_NE(std::string::npos, words.find(text)) << text;
+}
+
+TEST(Outputs, PicturesOfSeveralEvaluationsAreNumbered)
+{
+    const CTempFolder folder;
+    ASSERT_EQ(
+        0, RunProgram({"evaluate", ExampleCase("first-steps"), "--plot", folder / "p.svg"}).code);
+    const std::vector<std::string> expected{"p-1.svg", "p-2.svg", "p-3.svg", "p-4.svg",
+                                            "p-5.svg", "p-6.svg", "p-7.svg", "p-8.svg"};
+    EXPECT_EQ(expected, folder.Names());
+    const std::string ec8 = Words(ReadText(folder / "p-6.svg"));
+    for (const char* text : {"PX EC8", "Bilinear capacity", "SD demand"})
+        EXPECT_NE(std::string::npos, ec8.find(text)) << text;
+}
+
+TEST(Outputs, PngAndPdfStartAsTheirFormatsDo)
+{
+    const CTempFolder folder;
+    const std::pair<const char*, std::string> kFormats[] = {{"p.png", "\x89PNG\r\n"},
+                                                            {"p.pdf", "%PDF-1."}};
+    for (const auto& [name, head] : kFormats) {
+        ASSERT_EQ(0, RunProgram({"evaluate", ExampleCase("first-steps"), "--only", kOne, "--plot",
+                                 folder / name})
+                         .code);
+        const std::string bytes = ReadText(folder / name);
+        EXPECT_EQ(head, bytes.substr(0, head.size())) << name;
+        EXPECT_GT(bytes.size(), 5000U) << name;
+    }
+}
+
+TEST(Outputs, AnUnknownPictureFormatIsWrongUsage)
+{
+    const CTempFolder folder;
+    const T_RUN run = RunProgram({"evaluate", ExampleCase("first-steps"), "--only", kOne, "--json",
+                                  folder / "o.json", "--plot", folder / "p.gif"});
+    EXPECT_EQ(2, run.code);
+    EXPECT_EQ(1U, Lines(run.err).size()) << run.err;
+    EXPECT_TRUE(folder.Names().empty()) << "refused before anything is written";
+}
+
+#endif
+
+} // namespace
