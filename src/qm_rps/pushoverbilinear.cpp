@@ -50,14 +50,15 @@ std::size_t FirstMaximum(const std::vector<double>& Sa)
 double CurveArea(const T_ADRS_VIEW& c, double d)
 {
     double sum = 0.0;
-    for (std::size_t i = 0; i + 1 < c.Size() && !(c.Sd[i] > d); ++i) {
+    for (std::size_t i = 0; i + 1 < c.Size(); ++i) {
         if (d >= c.Sd[i + 1]) {
             sum += (c.Sa[i] + c.Sa[i + 1]) / 2.0 * (c.Sd[i + 1] - c.Sd[i]);
-        } else {
+        } else if (c.Sd[i] <= d) {
             const double w = (d - c.Sd[i]) / (c.Sd[i + 1] - c.Sd[i]);
             const double Sad = c.Sa[i] + w * (c.Sa[i + 1] - c.Sa[i]);
             sum += (Sad + c.Sa[i]) / 2.0 * (d - c.Sd[i]);
         }
+        if (c.Sd[i] > d) break; // a curve that turns back ends with the segment that starts beyond d
     }
     return sum;
 }
