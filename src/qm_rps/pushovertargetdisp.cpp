@@ -91,13 +91,13 @@ int FindPeakStep(std::span<const double> V)
     return static_cast<int>(peak);
 }
 
-std::optional<int> FindDriftStep(int peak, double limit, const T_DRIFT_OF_STEP& drift)
+std::optional<int> FindDriftStep(int peak, int last, double limit, const T_DRIFT_OF_STEP& drift)
 {
     const auto atPeak = drift(peak);
     if (!atPeak) return std::nullopt;
     if (*atPeak <= limit) return peak;
     double chosenDrift = 1.0;
-    int chosen = peak;
+    int chosen = last;
     for (int i = 1; i <= peak; ++i) {
         const auto value = drift(i);
         if (!value) return std::nullopt;

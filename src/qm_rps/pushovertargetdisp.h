@@ -49,8 +49,9 @@ using T_DRIFT_OF_STEP = std::function<std::optional<double>(int step)>;
 int FindPeakStep(std::span<const double> V);
 
 /// Step up to the peak whose drift is nearest to a limit; the peak itself where its drift is
-/// within the limit. Empty where drifts are missing.
-std::optional<int> FindDriftStep(int peak, double limit, const T_DRIFT_OF_STEP& drift);
+/// within the limit; `last` where no drift is nearer to the limit than 1. Empty where drifts are
+/// missing.
+std::optional<int> FindDriftStep(int peak, int last, double limit, const T_DRIFT_OF_STEP& drift);
 
 /// First crossing of the force with a level, from the peak on, where the displacement is not below
 /// `dMin`. The step is the nearer end of the interval, the lower one at the midpoint.

@@ -153,7 +153,7 @@ int CPushOverTargetEvaluation::UpdateTargetDispDataCapacity()
     const auto& [d, V] = m_in.capacity;
     const int last = static_cast<int>(d.size()) - 1;
     const int peak = FindPeakStep(V);
-    const int dlStep = FindDriftStep(peak, kDamageDrift, m_in.drift).value_or(last);
+    const int dlStep = FindDriftStep(peak, last, kDamageDrift, m_in.drift).value_or(last);
     const double dl = d[static_cast<std::size_t>(dlStep)];
     const auto drop = FindStrengthDrop(d, V, peak, kStrengthLeft * m_bilinear->ay, m_bilinear->du);
     m_noDrop = !drop;
@@ -203,7 +203,9 @@ int CPushOverTargetEvaluation::UpdateTargetDispDataNTC(PUSH_METHOD code)
     FindNTC2008Steps(demands);
     FinishOutcome();
 
-    const auto driftStep = FindDriftStep(FindPeakStep(m_in.capacity.Sa), kSldDrift, m_in.drift);
+    const int last = static_cast<int>(m_in.capacity.Sd.size()) - 1;
+    const auto driftStep =
+        FindDriftStep(FindPeakStep(m_in.capacity.Sa), last, kSldDrift, m_in.drift);
     if (driftStep) {
         m_rows[1].capacityStep = m_rows[2].capacityStep = *driftStep;
         if (code == PUSH_METHOD::Ntc2008)
