@@ -18,12 +18,11 @@ bool AtOrigin(const T_POINT2& p, const T_POINT2& a, const T_POINT2& b)
 }
 
 /// True when both ends of a segment lie clearly on one side of a line: `a` and `b` are the signed
-/// sides of its ends, `scaleA` and `scaleB` the sizes of the terms they came from.
-bool Aside(double a, double scaleA, double b, double scaleB)
+/// sides of its ends, `scale` the larger size of the terms they came from.
+bool Aside(double a, double b, double scale)
 {
     constexpr double kClear = 1e-6; // far wider than any touch
-    return (a > kClear * scaleA && b > kClear * scaleB) ||
-           (a < -kClear * scaleA && b < -kClear * scaleB);
+    return std::min(a, b) > kClear * scale || std::max(a, b) < -kClear * scale;
 }
 
 enum class LINE {
@@ -42,7 +41,7 @@ std::optional<T_POINT2> FirstCrossing(T_POINT2 P1, T_POINT2 P2, const T_ADRS_VIE
         const double side = up - right, scale = std::fabs(up) + std::fabs(right);
         const double before = std::exchange(sideA, side);
         const double scaleBefore = std::exchange(scaleA, scale);
-        if (i == 0 || Aside(before, scaleBefore, side, scale)) continue;
+        if (i == 0 || Aside(before, side, std::max(scaleBefore, scale))) continue;
         const T_POINT2 a = curve.At(i - 1), b = curve.At(i);
         double param = 0.0;
         T_POINT2 point;
@@ -100,11 +99,12 @@ bool NearOrigin(const T_POINT2& a, const T_POINT2& b)
 /// True when the whole range of the demand lies clearly above the segment a-b.
 bool Above(const T_POINT2& a, const T_POINT2& b, const T_ADRS_VIEW& demand, T_RANGE range)
 {
-    const double level = std::max(a.y, b.y) * (1.0 + 1e-6);
-    std::size_t above = 0;
-    for (std::size_t k = range.first; k <= range.last; ++k)
-        above += demand.Sa[k] > level;
-    return above == range.last - range.first + 1;
+    double least = demand.Sa[range.first], most = least;
+    for (std::size_t k = range.first + 1; k <= range.last; ++k) {
+        least = std::min(least, demand.Sa[k]);
+        most = std::max(most, demand.Sa[k]);
+    }
+    return least - std::max(a.y, b.y) > 1e-6 * most;
 }
 
 /// True when a point of the range has no ordinate above 0, hence no radial angle.
@@ -119,17 +119,15 @@ bool HasZero(const T_ADRS_VIEW& demand, T_RANGE range)
 /// True when no demand point of the range comes to the other side of the line a-b, nor near it.
 bool OneSided(const T_POINT2& a, const T_POINT2& b, const T_ADRS_VIEW& demand, T_RANGE range)
 {
-    constexpr double kClear = 1e-6; // far wider than any touch
     const double rx = b.x - a.x, ry = b.y - a.y;
-    std::size_t above = 0, below = 0;
+    double least = INFINITY, most = -INFINITY, scale = 0.0;
     for (std::size_t k = range.first; k <= range.last; ++k) {
         const double up = rx * (demand.Sa[k] - a.y), right = ry * (demand.Sd[k] - a.x);
-        const double clear = kClear * (std::fabs(up) + std::fabs(right));
-        above += up - right > clear;
-        below += up - right < -clear;
+        least = std::min(least, up - right);
+        most = std::max(most, up - right);
+        scale = std::max(scale, std::fabs(up) + std::fabs(right));
     }
-    const std::size_t count = range.last - range.first + 1;
-    return above == count || below == count;
+    return Aside(least, most, scale);
 }
 
 /// Crossing nearest the start of the capacity segment a-b.
