@@ -2,6 +2,9 @@
 
 #include "qm_db/recordunits.h"
 
+#include <set>
+#include <utility>
+
 namespace {
 
 template <class T>
@@ -26,6 +29,15 @@ int FindByName(const T_TABLE<T>& table, std::string_view name, int& key)
 }
 
 } // namespace
+
+std::vector<int> ElementsWithHingeType(const T_MODEL& model, int hingeType)
+{
+    std::set<int> ids;
+    for (const auto& entry : model.hinges) {
+        if (entry.second.hingeType == hingeType) ids.insert(entry.second.element);
+    }
+    return {ids.begin(), ids.end()};
+}
 
 int CAttrCtrl::GetStyp(T_STYP_D& out) const
 {
@@ -62,6 +74,58 @@ int CAttrCtrl::GetEval(int key, T_EVAL_D& out) const
     return Get(m_data.Model().evaluations, key, m_data.Units(), out);
 }
 
+int CAttrCtrl::GetMatl(int key, T_MATL_D& out) const
+{
+    return Get(m_data.Model().materials, key, m_data.Units(), out);
+}
+
+int CAttrCtrl::GetSect(int key, T_SECT_D& out) const
+{
+    return Get(m_data.Model().sections, key, m_data.Units(), out);
+}
+
+int CAttrCtrl::GetElem(int id, T_ELEM_D& out) const
+{
+    return Get(m_data.Model().elements, id, m_data.Units(), out);
+}
+
+int CAttrCtrl::GetPhgt(int key, T_PHGT_D& out) const
+{
+    return Get(m_data.Model().hingeTypes, key, m_data.Units(), out);
+}
+
+int CAttrCtrl::GetPhge(int key, T_PHGE_D& out) const
+{
+    return Get(m_data.Model().hinges, key, m_data.Units(), out);
+}
+
+int CAttrCtrl::GetIehp(int key, T_IEHP_D& out) const
+{
+    return Get(m_data.Model().inelasticHinges, key, m_data.Units(), out);
+}
+
+int CAttrCtrl::GetPofc(int key, T_POFC_D& out) const
+{
+    return Get(m_data.Model().incrementFunctions, key, m_data.Units(), out);
+}
+
+int CAttrCtrl::GetSectMatlByElem(int element, T_SECT_D& sect, T_MATL_D& matl) const
+{
+    T_ELEM_D elem;
+    T_SECT_D s;
+    T_MATL_D m;
+    if (!GetElem(element, elem) || !GetSect(elem.section, s) || !GetMatl(elem.material, m))
+        return 0;
+    sect = std::move(s);
+    matl = std::move(m);
+    return 1;
+}
+
+std::vector<int> CAttrCtrl::GetElemsByPhgt(int hingeType) const
+{
+    return ElementsWithHingeType(m_data.Model(), hingeType);
+}
+
 int CAttrCtrl::FindPolc(std::string_view name, int& key) const
 {
     return FindByName(m_data.Model().pushovers, name, key);
@@ -70,4 +134,29 @@ int CAttrCtrl::FindPolc(std::string_view name, int& key) const
 int CAttrCtrl::FindSpfc(std::string_view name, int& key) const
 {
     return FindByName(m_data.Model().spectra, name, key);
+}
+
+int CAttrCtrl::FindMatl(std::string_view name, int& key) const
+{
+    return FindByName(m_data.Model().materials, name, key);
+}
+
+int CAttrCtrl::FindSect(std::string_view name, int& key) const
+{
+    return FindByName(m_data.Model().sections, name, key);
+}
+
+int CAttrCtrl::FindPhgt(std::string_view name, int& key) const
+{
+    return FindByName(m_data.Model().hingeTypes, name, key);
+}
+
+int CAttrCtrl::FindIehp(std::string_view name, int& key) const
+{
+    return FindByName(m_data.Model().inelasticHinges, name, key);
+}
+
+int CAttrCtrl::FindPofc(std::string_view name, int& key) const
+{
+    return FindByName(m_data.Model().incrementFunctions, name, key);
 }

@@ -2,8 +2,12 @@
 #pragma once
 
 #include "qm_db/datactrl.h"
+#include "qm_db/hingetype.h"
 
 #include <string_view>
+
+/// Ids of the elements with a hinge of that type, ascending, each once.
+std::vector<int> ElementsWithHingeType(const T_MODEL& model, int hingeType);
 
 class CAttrCtrl {
 public:
@@ -17,10 +21,40 @@ public:
     [[nodiscard]] int GetPolc(int key, T_POLC_D& out) const;
     [[nodiscard]] int GetSpfc(int key, T_SPFC_D& out) const;
     [[nodiscard]] int GetEval(int key, T_EVAL_D& out) const;
+    [[nodiscard]] int GetMatl(int key, T_MATL_D& out) const;
+    [[nodiscard]] int GetSect(int key, T_SECT_D& out) const;
+    [[nodiscard]] int GetElem(int id, T_ELEM_D& out) const;
+    [[nodiscard]] int GetPhgt(int key, T_PHGT_D& out) const;
+    [[nodiscard]] int GetPhge(int key, T_PHGE_D& out) const;
+    [[nodiscard]] int GetIehp(int key, T_IEHP_D& out) const;
+    [[nodiscard]] int GetPofc(int key, T_POFC_D& out) const;
+    /// Section and material of an element. 0: no such element, or it lacks one of them; neither
+    /// output is changed.
+    [[nodiscard]] int GetSectMatlByElem(int element, T_SECT_D& sect, T_MATL_D& matl) const;
+    /// Ids of the elements with a hinge of that type, ascending, each once.
+    std::vector<int> GetElemsByPhgt(int hingeType) const;
 
     /// Key of the record with that name. 1 found; 0 not, output as it was.
     [[nodiscard]] int FindPolc(std::string_view name, int& key) const;
     [[nodiscard]] int FindSpfc(std::string_view name, int& key) const;
+    [[nodiscard]] int FindMatl(std::string_view name, int& key) const;
+    [[nodiscard]] int FindSect(std::string_view name, int& key) const;
+    [[nodiscard]] int FindPhgt(std::string_view name, int& key) const;
+    [[nodiscard]] int FindIehp(std::string_view name, int& key) const;
+    [[nodiscard]] int FindPofc(std::string_view name, int& key) const;
+
+    /// A hinge type of one active FEMA component out of an inelastic hinge, and its I-end's curve
+    /// back; component 0 to 5. See ConvertIehpToPhgtFema.
+    [[nodiscard]] static int Convert_IehpToPhgt_FEMA(const T_IEHP_D& in, int component,
+                                                     T_PHGT_D& out)
+    {
+        return ConvertIehpToPhgtFema(in, component, out);
+    }
+    [[nodiscard]] static int Convert_PhgtToIehp_FEMA(const T_PHGT_D& in, int component,
+                                                     T_IEHP_D& out)
+    {
+        return ConvertPhgtToIehpFema(in, component, out);
+    }
 
 private:
     const CDataCtrl& m_data;

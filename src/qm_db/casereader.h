@@ -11,6 +11,8 @@
 /// The whole document. `folder` is where relative paths of recorder files start.
 void ReadCase(CJsonReader& root, const std::string& folder, T_MODEL_CONTENT& content);
 
+/// Design codes, hinge options, and the tables from the materials to the inelastic hinges.
+void ReadHingeTables(CJsonReader& root, T_MODEL& model);
 void ReadSpectra(CJsonReader& root, T_MODEL& model);
 void ReadPushovers(CJsonReader& root, const std::string& folder, T_MODEL_CONTENT& content);
 void ReadEvaluations(CJsonReader& root, T_MODEL& model);

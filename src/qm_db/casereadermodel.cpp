@@ -78,8 +78,9 @@ void ReadMode(CJsonReader& in, std::size_t index, T_MODEL& model)
 void ReadCase(CJsonReader& root, const std::string& folder, T_MODEL_CONTENT& content)
 {
     T_MODEL& model = content.model;
-    root.Keys({"format", "title", "units", "gravity", "nodes", "storeys", "modes", "spectra",
-               "pushover", "evaluations"});
+    root.Keys({"format", "title", "units", "gravity", "nodes", "storeys", "modes", "design_codes",
+               "hinge_options", "materials", "sections", "elements", "increment_functions",
+               "hinge_types", "hinges", "inelastic_hinges", "spectra", "pushover", "evaluations"});
     ReadHead(root, model.styp);
     root.Member("nodes").ForEachItem(
         [&](CJsonReader& item, std::size_t) { ReadNode(item, model); });
@@ -89,6 +90,7 @@ void ReadCase(CJsonReader& root, const std::string& folder, T_MODEL_CONTENT& con
     });
     ForEachRecord(root, "modes",
                   [&](CJsonReader& item, std::size_t index) { ReadMode(item, index, model); });
+    ReadHingeTables(root, model);
     ReadSpectra(root, model);
     ReadPushovers(root, folder, content);
     ReadEvaluations(root, model);

@@ -1,3 +1,4 @@
+#include "qm_db/caseget.h"
 #include "qm_db/casereader.h"
 #include "qm_db/jsonnames.h"
 
@@ -40,18 +41,23 @@ void ReadPushover(CJsonReader& in, int key, const std::string& folder, T_MODEL_C
 {
     T_MODEL& model = content.model;
     T_POLC_D push;
-    in.Keys({"name", "control_node", "direction", "pattern", "steps", "limit_state_steps"});
+    CCaseGet rest(in, model.styp.units,
+                  {"name", "control_node", "direction", "pattern", "steps", "limit_state_steps"});
+    CaseFields(rest, push);
+    rest.Finish();
     in.GetName("name", push.name, taken);
     in.Get("control_node", push.controlNode);
     in.Check("control_node", model.nodes.contains(push.controlNode), "there is no such node");
     push.direction = 1 + in.Choice("direction", kDirectionNames, "direction");
     ReadPattern(in.Member("pattern"), model, push);
-    T_PUSH_DATA data;
-    CJsonReader steps = in.Member("steps");
-    ReadSteps(steps, folder, model, push, data);
+    if (in.Has("steps") || !push.control) { // a case with "control" may still have to be run
+        T_PUSH_DATA data;
+        CJsonReader steps = in.Member("steps");
+        ReadSteps(steps, folder, model, push, data);
+        content.results[key] = MakePushResult(std::move(data));
+    }
     if (in.Has("limit_state_steps"))
         ReadLimitStateSteps(in.Member("limit_state_steps"), model.poverSteps[key]);
-    content.results[key] = MakePushResult(std::move(data));
     model.pushovers[key] = std::move(push);
 }
 

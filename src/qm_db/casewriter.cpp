@@ -85,6 +85,7 @@ void WriteCase(CJsonWriter& out, const T_MODEL_CONTENT& content)
     WriteNodes(out, content.model);
     WriteStoreys(out, content.model);
     WriteModes(out, content.model);
+    WriteHingeTables(out, content.model);
     WriteSpectra(out, content.model);
     WritePushovers(out, content);
     WriteEvaluations(out, content.model);

@@ -4,11 +4,12 @@
 #include "qm_db/jsonwriter.h"
 #include "qm_db/modelstore.h"
 
-/// The whole document. A fault (a value that is not finite, a load case without results, a result
-/// that can't be read) is kept by the writer.
+/// The whole document. A fault (a value that is not finite, a load case without results that has no
+/// control, a result that can't be read) is kept by the writer.
 void WriteCase(CJsonWriter& out, const T_MODEL_CONTENT& content);
 
 /// Its parts; each writes one member of the document, or nothing when its table is empty.
+void WriteHingeTables(CJsonWriter& out, const T_MODEL& model);
 void WriteSpectra(CJsonWriter& out, const T_MODEL& model);
 void WritePushovers(CJsonWriter& out, const T_MODEL_CONTENT& content);
 void WriteEvaluations(CJsonWriter& out, const T_MODEL& model);

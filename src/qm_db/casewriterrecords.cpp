@@ -1,3 +1,4 @@
+#include "qm_db/caseput.h"
 #include "qm_db/casewriter.h"
 #include "qm_db/jsonnames.h"
 
@@ -120,13 +121,17 @@ void WritePushover(CJsonWriter& out, const T_MODEL_CONTENT& content, int key, co
     if (!push.modes.empty()) out.Member("modes", push.modes);
     out.EndObject();
 
-    out.Key("steps");
+    CCasePut rest(out);
+    CaseFields(rest, push);
     const auto it = content.results.find(key);
-    if (it == content.results.end() || !it->second || it->second->StepCount() < 1)
+    const bool hasSteps = it != content.results.end() && it->second && it->second->StepCount() > 0;
+    if (hasSteps || !push.control) out.Key("steps");
+    if (hasSteps)
+        WriteSteps(out, *it->second, push.direction);
+    else if (!push.control)
         return out.Fail("the load case \"" + push.name +
                         "\" has no results, which a case file "
                         "can't leave out");
-    WriteSteps(out, *it->second, push.direction);
     if (out.Failed()) return;
     WriteLimitStateSteps(out, content.model, key);
     out.EndObject();

@@ -3,43 +3,48 @@
 
 #include "qm_db/modelstore.h"
 
+/// Where the model keeps the table of a record type.
+template <class T>
+inline constexpr T_TABLE<T> T_MODEL::*kTableOf = nullptr;
+template <>
+inline constexpr T_TABLE<T_NODE_D> T_MODEL::*kTableOf<T_NODE_D> = &T_MODEL::nodes;
+template <>
+inline constexpr T_TABLE<T_STOR_D> T_MODEL::*kTableOf<T_STOR_D> = &T_MODEL::storeys;
+template <>
+inline constexpr T_TABLE<T_EIGV_D> T_MODEL::*kTableOf<T_EIGV_D> = &T_MODEL::modes;
+template <>
+inline constexpr T_TABLE<T_SPFC_D> T_MODEL::*kTableOf<T_SPFC_D> = &T_MODEL::spectra;
+template <>
+inline constexpr T_TABLE<T_POLC_D> T_MODEL::*kTableOf<T_POLC_D> = &T_MODEL::pushovers;
+template <>
+inline constexpr T_TABLE<T_EVAL_D> T_MODEL::*kTableOf<T_EVAL_D> = &T_MODEL::evaluations;
+template <>
+inline constexpr T_TABLE<T_POVR_D> T_MODEL::*kTableOf<T_POVR_D> = &T_MODEL::poverSteps;
+template <>
+inline constexpr T_TABLE<T_MATL_D> T_MODEL::*kTableOf<T_MATL_D> = &T_MODEL::materials;
+template <>
+inline constexpr T_TABLE<T_SECT_D> T_MODEL::*kTableOf<T_SECT_D> = &T_MODEL::sections;
+template <>
+inline constexpr T_TABLE<T_ELEM_D> T_MODEL::*kTableOf<T_ELEM_D> = &T_MODEL::elements;
+template <>
+inline constexpr T_TABLE<T_PHGT_D> T_MODEL::*kTableOf<T_PHGT_D> = &T_MODEL::hingeTypes;
+template <>
+inline constexpr T_TABLE<T_PHGE_D> T_MODEL::*kTableOf<T_PHGE_D> = &T_MODEL::hinges;
+template <>
+inline constexpr T_TABLE<T_IEHP_D> T_MODEL::*kTableOf<T_IEHP_D> = &T_MODEL::inelasticHinges;
+template <>
+inline constexpr T_TABLE<T_POFC_D> T_MODEL::*kTableOf<T_POFC_D> = &T_MODEL::incrementFunctions;
+
 /// Table of a record type: nodes for T_NODE_D, and so on.
 template <class T>
-T_TABLE<T>& TableOf(T_MODEL& model);
-template <>
-inline T_TABLE<T_NODE_D>& TableOf(T_MODEL& m)
+T_TABLE<T>& TableOf(T_MODEL& model)
 {
-    return m.nodes;
+    return model.*kTableOf<T>;
 }
-template <>
-inline T_TABLE<T_STOR_D>& TableOf(T_MODEL& m)
+template <class T>
+const T_TABLE<T>& TableOf(const T_MODEL& model)
 {
-    return m.storeys;
-}
-template <>
-inline T_TABLE<T_EIGV_D>& TableOf(T_MODEL& m)
-{
-    return m.modes;
-}
-template <>
-inline T_TABLE<T_SPFC_D>& TableOf(T_MODEL& m)
-{
-    return m.spectra;
-}
-template <>
-inline T_TABLE<T_POLC_D>& TableOf(T_MODEL& m)
-{
-    return m.pushovers;
-}
-template <>
-inline T_TABLE<T_EVAL_D>& TableOf(T_MODEL& m)
-{
-    return m.evaluations;
-}
-template <>
-inline T_TABLE<T_POVR_D>& TableOf(T_MODEL& m)
-{
-    return m.poverSteps;
+    return model.*kTableOf<T>;
 }
 
 class CDataCtrl {

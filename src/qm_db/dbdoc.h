@@ -3,8 +3,10 @@
 
 #include "qm_base/dynmodule.h"
 #include "qm_db/attrctrl.h"
+#include "qm_db/dblib.h"
 #include "qm_db/editdata.h"
 #include "qm_db/initctrl.h"
+#include "qm_db/membctrl.h"
 #include "qm_db/postctrl.h"
 #include "qm_db/unitctrl.h"
 
@@ -26,6 +28,8 @@ public:
     CPostCtrl& Post() { return m_post; }
     CUnitCtrl& Unit() { return m_unit; }
     CInitCtrl& Init() { return m_init; }
+    CDBLib& Lib() { return m_lib; }
+    CMembCtrl& Memb() { return m_memb; }
     CUndoCtrl& Undo() { return m_undo; }
     CEditData& Edit() { return m_edit; }
     CDynModuleMgr& DynModules() { return m_modules; }
@@ -51,6 +55,8 @@ private:
     CPostCtrl m_post{m_data};
     CUnitCtrl m_unit{m_data};
     CInitCtrl m_init{m_data};
+    CDBLib m_lib{m_data};
+    CMembCtrl m_memb{m_data};
     CUndoCtrl m_undo{m_data};
     CEditData m_edit{m_data, m_undo};
     CDynModuleMgr m_modules;

@@ -33,7 +33,14 @@ int CEditData::PutStyp(T_STYP_D styp)
 {
     if (!m_open) return 0;
     RecordToSi(styp, styp.units);
-    return Record(T_CHANGE<T_STYP_D>{0, m_data.Model().styp, std::move(styp)});
+    return Record(T_CHANGE<T_STYP_D>{0, std::make_shared<const T_STYP_D>(m_data.Model().styp),
+                                     std::make_shared<const T_STYP_D>(std::move(styp))});
+}
+
+int CEditData::ErasePhgt(int key, std::vector<int>& users)
+{
+    users = ElementsWithHingeType(m_data.Model(), key);
+    return users.empty() ? Erase<T_PHGT_D>(key) : 0;
 }
 
 int CEditData::Record(T_CHANGE_ANY change)

@@ -1,6 +1,8 @@
 // Edits of records: gathered in a step, committed as one undoable command or rolled back whole.
 #pragma once
 
+#include "qm_db/attrctrl.h"
+#include "qm_db/hingetype.h"
 #include "qm_db/recordunits.h"
 #include "qm_db/undoctrl.h"
 
@@ -17,32 +19,42 @@ public:
     bool IsOpen() const { return m_open; }
 
     /// Adds or replaces the record with that key; quantities in the document's current units.
+    /// Curves of a hinge type that are not of their component's type are replaced (FitCurves).
     /// 1 done; 0 no step is open.
     template <class T>
     [[nodiscard]] int Put(int key, T record)
     {
+        if constexpr (std::is_same_v<T, T_PHGT_D>) FitCurves(record);
         RecordToSi(record, m_data.Units());
-        return Change<T>(key, std::move(record));
+        return Change<T>(key, std::make_shared<const T>(std::move(record)));
     }
-    /// Deletes the record. 1 done; 0 no step is open or there is no such record.
+    /// Deletes the record. 1 done; 0 no step is open or there is no such record, or it is a hinge
+    /// type that hinges use.
     template <class T>
     [[nodiscard]] int Erase(int key)
     {
-        if (!TableOf<T>(m_data.ModelForEdit()).contains(key)) return 0;
-        return Change<T>(key, std::nullopt);
+        if constexpr (std::is_same_v<T, T_PHGT_D>) {
+            if (!ElementsWithHingeType(m_data.Model(), key).empty()) return 0;
+        }
+        if (!m_open || !TableOf<T>(m_data.Model()).contains(key)) return 0;
+        return Change<T>(key, nullptr);
     }
+    /// Deletes a hinge type. 1 done; 0 no step is open, there is no such type, or hinges use it:
+    /// `users` then has the ids of their elements, ascending.
+    [[nodiscard]] int ErasePhgt(int key, std::vector<int>& users);
     /// Title, current units and gravity (in the units that the record itself names). Changing
     /// the units changes no stored quantity.
     [[nodiscard]] int PutStyp(T_STYP_D styp);
 
 private:
     template <class T>
-    int Change(int key, std::optional<T> after)
+    int Change(int key, std::shared_ptr<const T> after)
     {
         if (!m_open) return 0;
-        const auto& table = TableOf<T>(m_data.ModelForEdit());
-        T_CHANGE<T> change{key, std::nullopt, std::move(after)};
-        if (const auto it = table.find(key); it != table.end()) change.before = it->second;
+        const auto& table = TableOf<T>(m_data.Model());
+        T_CHANGE<T> change{key, nullptr, std::move(after)};
+        if (const auto it = table.find(key); it != table.end())
+            change.before = std::make_shared<const T>(it->second);
         return Record(std::move(change));
     }
     int Record(T_CHANGE_ANY change);

@@ -76,7 +76,7 @@ T_JSON* CJsonReader::Find(std::string_view key) const
     return nullptr;
 }
 
-void CJsonReader::Keys(std::initializer_list<std::string_view> known)
+void CJsonReader::Keys(std::span<const std::string_view> known)
 {
     const auto* members = m_value ? std::get_if<T_JSON_MEMBERS>(&m_value->data) : nullptr;
     if (!members) return FailType("an object");

@@ -37,7 +37,11 @@ public:
     void CheckEach(std::string_view key, const R& values, F ok, const char* reason);
 
     /// This value is an object and has no other keys.
-    void Keys(std::initializer_list<std::string_view> known);
+    void Keys(std::initializer_list<std::string_view> known)
+    {
+        Keys(std::span<const std::string_view>(known.begin(), known.size()));
+    }
+    void Keys(std::span<const std::string_view> known);
     bool Has(std::string_view key) const { return Find(key) != nullptr; }
     /// A member that must be there.
     CJsonReader Member(std::string_view key);

@@ -15,8 +15,10 @@ void CJsonWriter::Fail(const std::string& reason)
 {
     if (Failed()) return;
     std::string place;
-    for (const T_LEVEL& level : m_levels)
+    for (const T_LEVEL& level : m_levels) {
+        if (!level.isArray && level.count == 0) break; // an object that has just begun
         place = level.isArray ? ItemPlace(place, level.count - 1) : MemberPlace(place, level.key);
+    }
     m_error = {FILE_FAULT::BadInput, place.empty() ? reason : place + ": " + reason};
 }
 

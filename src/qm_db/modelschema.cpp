@@ -9,6 +9,24 @@
 
 namespace {
 
+// Tables that came with version 2. Nested records are text: "body" is the record's object in the
+// case file, in SI, without its key and name. Elements and generated hinges are in "arrays".
+constexpr const char* kMaterials =
+    "CREATE TABLE materials(key INTEGER PRIMARY KEY, name TEXT NOT NULL, body TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT";
+constexpr const char* kSections =
+    "CREATE TABLE sections(key INTEGER PRIMARY KEY, name TEXT NOT NULL, body TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT";
+constexpr const char* kHingeTypes =
+    "CREATE TABLE hinge_types(key INTEGER PRIMARY KEY, name TEXT NOT NULL, body TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT";
+constexpr const char* kInelasticHinges =
+    "CREATE TABLE inelastic_hinges(key INTEGER PRIMARY KEY, name TEXT NOT NULL, "
+    "body TEXT NOT NULL, negative_zeros INTEGER NOT NULL) STRICT";
+constexpr const char* kIncrementFunctions =
+    "CREATE TABLE increment_functions(key INTEGER PRIMARY KEY, name TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT";
+
 // Scalars are typed columns, quantities in SI. Bit i of negative_zeros says that the i-th column
 // of the row is -0.0: a REAL column stores a whole number as an integer, which has no such value.
 // Every list of numbers (node ids, coordinates, mode shapes, spectrum tables) is a row of "arrays":
@@ -16,7 +34,9 @@ namespace {
 // A change here is a new schema version and a migration.
 constexpr const char* kTables[] = {
     "CREATE TABLE model(key INTEGER PRIMARY KEY, title TEXT NOT NULL, force_unit TEXT NOT NULL, "
-    "length_unit TEXT NOT NULL, gravity REAL, negative_zeros INTEGER NOT NULL) STRICT",
+    "length_unit TEXT NOT NULL, gravity REAL, negative_zeros INTEGER NOT NULL, "
+    "concrete_code TEXT, steel_code TEXT, alternative_hysteresis INTEGER NOT NULL, "
+    "wall_strength_degradation INTEGER NOT NULL, gsd INTEGER NOT NULL) STRICT",
 
     "CREATE TABLE storeys(key INTEGER PRIMARY KEY, name TEXT NOT NULL, height REAL NOT NULL, "
     "negative_zeros INTEGER NOT NULL) STRICT",
@@ -33,7 +53,7 @@ constexpr const char* kTables[] = {
 
     "CREATE TABLE pushovers(key INTEGER PRIMARY KEY, name TEXT NOT NULL, "
     "control_node INTEGER NOT NULL, direction INTEGER NOT NULL, pattern_kind INTEGER NOT NULL, "
-    "negative_zeros INTEGER NOT NULL) STRICT",
+    "negative_zeros INTEGER NOT NULL, body TEXT) STRICT",
 
     "CREATE TABLE evaluations(key INTEGER PRIMARY KEY, name TEXT NOT NULL, push TEXT NOT NULL, "
     "method INTEGER NOT NULL, procedure TEXT, spectrum TEXT NOT NULL, behavior INTEGER, "
@@ -60,13 +80,30 @@ constexpr const char* kTables[] = {
     "width INTEGER NOT NULL, byte_order TEXT NOT NULL, checksum INTEGER NOT NULL, "
     "data BLOB NOT NULL, PRIMARY KEY(pushover, part, chunk, step)) STRICT, WITHOUT ROWID",
 
-    "CREATE TABLE checksums(name TEXT PRIMARY KEY, value INTEGER NOT NULL) STRICT, WITHOUT ROWID"};
+    "CREATE TABLE checksums(name TEXT PRIMARY KEY, value INTEGER NOT NULL) STRICT, WITHOUT ROWID",
+
+    kMaterials, kSections, kHingeTypes, kInelasticHinges, kIncrementFunctions};
+
+/// Version 1 had no hinges and no load cases that are still to be run.
+void MigrateFrom1(const CSqliteDb& db)
+{
+    db.Exec("ALTER TABLE model ADD COLUMN concrete_code TEXT;"
+            "ALTER TABLE model ADD COLUMN steel_code TEXT;"
+            "ALTER TABLE model ADD COLUMN alternative_hysteresis INTEGER NOT NULL DEFAULT 0;"
+            "ALTER TABLE model ADD COLUMN wall_strength_degradation INTEGER NOT NULL DEFAULT 0;"
+            "ALTER TABLE model ADD COLUMN gsd INTEGER NOT NULL DEFAULT 0;"
+            "ALTER TABLE pushovers ADD COLUMN body TEXT");
+    for (const char* const sql :
+         {kMaterials, kSections, kHingeTypes, kInelasticHinges, kIncrementFunctions})
+        db.Exec(sql);
+}
 
 } // namespace
 
 const T_SCHEMA& CurrentSchema()
 {
-    static constexpr T_SCHEMA kSchema{1, {}}; // version 1 is the first: nothing to migrate yet
+    static constexpr T_MIGRATION kMigrations[] = {{1, MigrateFrom1}};
+    static constexpr T_SCHEMA kSchema{2, kMigrations};
     return kSchema;
 }
 

@@ -24,9 +24,20 @@ struct T_SCHEMA {
 
 /// Tables with a checksum of their own, in the order of writing. "sqlite_schema" (the text of the
 /// schema itself) is summed too; result_blocks is summed without the data, which have their own.
-inline constexpr std::array<const char*, 9> kModelTables{
-    "model",       "storeys",           "modes",  "spectra", "pushovers",
-    "evaluations", "limit_state_steps", "arrays", "results"};
+inline constexpr std::array<const char*, 14> kModelTables{"model",
+                                                          "storeys",
+                                                          "modes",
+                                                          "spectra",
+                                                          "pushovers",
+                                                          "evaluations",
+                                                          "limit_state_steps",
+                                                          "materials",
+                                                          "sections",
+                                                          "hinge_types",
+                                                          "arrays",
+                                                          "results",
+                                                          "inelastic_hinges",
+                                                          "increment_functions"};
 inline constexpr const char* kBlockTable = "result_blocks";
 inline constexpr const char* kSumTable = "checksums";
 

@@ -52,7 +52,7 @@ int CPostCtrl::GetNumEigvPost() const
 
 int CPostCtrl::SelectMode(int mode)
 {
-    if (!m_data.Model().modes.contains(mode)) return 0;
+    if (mode != 0 && !m_data.Model().modes.contains(mode)) return 0;
     m_mode = mode;
     return 1;
 }
@@ -150,6 +150,7 @@ int CPostCtrl::SelectPushover(int loadCase)
         m_revision = m_data.Revision();
     }
     m_step = 0;
+    m_error.clear();
     return 1;
 }
 

@@ -21,6 +21,11 @@ void Fields(V& v, typename V::template Ref<T_STYP_D> r)
     v("force_unit", r.units.force);
     v("length_unit", r.units.length);
     v("gravity", r.gravity);
+    v("concrete_code", r.designCodes.concrete);
+    v("steel_code", r.designCodes.steel);
+    v("alternative_hysteresis", r.alternativeHysteresis);
+    v("wall_strength_degradation", r.wallStrengthDegradation);
+    v("gsd", r.gsd);
 }
 
 template <class V>
@@ -99,6 +104,41 @@ void Fields(V& v, typename V::template Ref<T_POLC_D> r)
     v("direction", r.direction);
     v("pattern_kind", r.patternKind);
     v.Array("modes", r.modes);
+    v.BodyIf(r, r.control || !r.patterns.empty());
+}
+
+template <class V>
+void Fields(V& v, typename V::template Ref<T_POFC_D> r)
+{
+    v("name", r.name);
+    v.Array("step", r.step);
+    v.Array("factor", r.factor);
+}
+
+// Records with a name and a body.
+template <class V>
+void Fields(V& v, typename V::template Ref<T_MATL_D> r)
+{
+    v("name", r.name);
+    v.Body(r);
+}
+template <class V>
+void Fields(V& v, typename V::template Ref<T_SECT_D> r)
+{
+    v("name", r.name);
+    v.Body(r);
+}
+template <class V>
+void Fields(V& v, typename V::template Ref<T_PHGT_D> r)
+{
+    v("name", r.name);
+    v.Body(r);
+}
+template <class V>
+void Fields(V& v, typename V::template Ref<T_IEHP_D> r)
+{
+    v("name", r.name);
+    v.Body(r);
 }
 
 template <class V>
@@ -263,12 +303,78 @@ void GetNodeChunk(const CPackedArrays& arrays, std::int64_t chunk, T_TABLE<T_NOD
     }
 }
 
+// Elements and generated hinges are many and small: a few packed lists for all of them.
+constexpr const char* kElements = "elements";
+constexpr std::size_t kElementWidth = 6; // id, nodes, section, material, member
+constexpr const char* kHinges = "hinges";
+constexpr std::size_t kHingeWidth = 3; // key, element, type
+constexpr std::size_t kStrengthWidth = sizeof(T_PHGE_D::crack) / sizeof(double); // crack; yield
+
+void PutElements(const T_TABLE<T_ELEM_D>& elements, CPackedArrays& arrays)
+{
+    std::vector<int> all;
+    for (const auto& [key, e] : elements)
+        all.insert(all.end(), {key, e.nodeI, e.nodeJ, e.section, e.material, e.member});
+    if (!all.empty()) arrays.Put(kElements, 0, "data", all);
+}
+
+void GetElements(const CPackedArrays& arrays, T_TABLE<T_ELEM_D>& elements)
+{
+    const std::vector<int> all = arrays.Ints(kElements, 0, "data");
+    if (all.size() % kElementWidth != 0) ThrowDamaged(kElements);
+    for (std::size_t i = 0; i < all.size(); i += kElementWidth)
+        elements.insert_or_assign(
+            elements.end(), all[i],
+            T_ELEM_D{all[i], all[i + 1], all[i + 2], all[i + 3], all[i + 4], all[i + 5]});
+}
+
+void PutHinges(const T_TABLE<T_PHGE_D>& hinges, CPackedArrays& arrays)
+{
+    std::vector<int> refs;
+    std::vector<double> crack, yield;
+    for (const auto& [key, hinge] : hinges) {
+        refs.insert(refs.end(), {key, hinge.element, hinge.hingeType});
+        for (std::size_t i = 0; i < hinge.crack.size(); ++i) {
+            crack.insert(crack.end(), {hinge.crack[i].pos, hinge.crack[i].neg});
+            yield.insert(yield.end(), {hinge.yield[i].pos, hinge.yield[i].neg});
+        }
+    }
+    if (refs.empty()) return;
+    arrays.Put(kHinges, 0, "refs", refs);
+    arrays.Put(kHinges, 0, "crack", crack);
+    arrays.Put(kHinges, 0, "yield", yield);
+}
+
+void GetHinges(const CPackedArrays& arrays, T_TABLE<T_PHGE_D>& hinges)
+{
+    const std::vector<int> refs = arrays.Ints(kHinges, 0, "refs");
+    const std::vector<double> crack = arrays.Doubles(kHinges, 0, "crack");
+    const std::vector<double> yield = arrays.Doubles(kHinges, 0, "yield");
+    const std::size_t count = refs.size() / kHingeWidth;
+    if (refs.size() % kHingeWidth != 0 || crack.size() != count * kStrengthWidth ||
+        yield.size() != crack.size())
+        ThrowDamaged(kHinges);
+    for (std::size_t i = 0; i < count; ++i) {
+        const int* const from = &refs[i * kHingeWidth];
+        T_PHGE_D& hinge = hinges.try_emplace(hinges.end(), from[0])->second;
+        hinge.element = from[1];
+        hinge.hingeType = from[2];
+        for (std::size_t c = 0; c < hinge.crack.size(); ++c) {
+            const std::size_t at = i * kStrengthWidth + 2 * c;
+            hinge.crack[c] = {crack[at], crack[at + 1]};
+            hinge.yield[c] = {yield[at], yield[at + 1]};
+        }
+    }
+}
+
 } // namespace
 
 void WriteModel(const CSqliteDb& db, const T_MODEL& model)
 {
     CPackedArrays arrays;
     PutNodes(model.nodes, arrays);
+    PutElements(model.elements, arrays);
+    PutHinges(model.hinges, arrays);
     WriteRecord(db, "model", 1, model.styp, arrays);
     WriteTable(db, "storeys", model.storeys, arrays);
     WriteTable(db, "modes", model.modes, arrays);
@@ -276,6 +382,11 @@ void WriteModel(const CSqliteDb& db, const T_MODEL& model)
     WriteTable(db, "pushovers", model.pushovers, arrays);
     WriteTable(db, "evaluations", model.evaluations, arrays);
     WriteTable(db, "limit_state_steps", model.poverSteps, arrays);
+    WriteTable(db, "materials", model.materials, arrays);
+    WriteTable(db, "sections", model.sections, arrays);
+    WriteTable(db, "hinge_types", model.hingeTypes, arrays);
+    WriteTable(db, "inelastic_hinges", model.inelasticHinges, arrays);
+    WriteTable(db, "increment_functions", model.incrementFunctions, arrays);
     arrays.Write(db);
 }
 
@@ -298,5 +409,12 @@ T_MODEL ReadModel(const CSqliteDb& db, T_TABLE_SUMS& sums)
     model.pushovers = ReadTable<T_POLC_D>(db, "pushovers", arrays, sums);
     model.evaluations = ReadTable<T_EVAL_D>(db, "evaluations", arrays, sums);
     model.poverSteps = ReadTable<T_POVR_D>(db, "limit_state_steps", arrays, sums);
+    model.materials = ReadTable<T_MATL_D>(db, "materials", arrays, sums);
+    model.sections = ReadTable<T_SECT_D>(db, "sections", arrays, sums);
+    model.hingeTypes = ReadTable<T_PHGT_D>(db, "hinge_types", arrays, sums);
+    model.inelasticHinges = ReadTable<T_IEHP_D>(db, "inelastic_hinges", arrays, sums);
+    model.incrementFunctions = ReadTable<T_POFC_D>(db, "increment_functions", arrays, sums);
+    GetElements(arrays, model.elements);
+    GetHinges(arrays, model.hinges);
     return model;
 }

@@ -1,9 +1,11 @@
 // Visitors that carry the fields of a record into a row and its arrays, and back.
 #pragma once
 
+#include "qm_db/recordbody.h"
 #include "qm_db/recordcodecarrays.h"
 #include "qm_db/recordcodecrow.h"
 #include "qm_db/records.h"
+#include "qm_db/storefault.h"
 
 #include <limits>
 
@@ -72,6 +74,23 @@ public:
     void Array(const char* name, const std::optional<std::array<T, N>>& values)
     {
         if (values) PutArray(name, std::span<const T>(*values));
+    }
+    /// The nested members of a record as text.
+    template <class R>
+    void Body(const R& record)
+    {
+        std::string text;
+        T_FILE_ERROR error;
+        if (!PrintBody(record, text, error)) {
+            throw CStoreFault(FILE_FAULT::BadInput, "IDS_QM_DB_FILE_BAD_RECORD",
+                              m_row.Table() + ' ' + std::to_string(m_row.Key()) + ' ' + error.text);
+        }
+        m_row.Put("body", std::move(text));
+    }
+    template <class R>
+    void BodyIf(const R& record, bool isThere)
+    {
+        if (isThere) Body(record);
     }
     void Kind(const T_SPFC_D& spectrum)
     {
@@ -175,6 +194,17 @@ public:
         Array(name, list);
         if (list.size() != N) m_row.ThrowBadCell(name);
         std::copy(list.begin(), list.end(), values.emplace().begin());
+    }
+    template <class R>
+    void Body(R& record) const
+    {
+        T_FILE_ERROR error;
+        if (!ParseBody(Need<std::string>("body"), record, error)) m_row.ThrowBadCell("body");
+    }
+    template <class R>
+    void BodyIf(R& record, bool) const
+    {
+        if (!IsNull("body")) Body(record);
     }
     void Kind(T_SPFC_D& spectrum) const
     {

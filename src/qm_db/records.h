@@ -1,6 +1,7 @@
 // Records of the model database. Plain data; in the store every quantity is in SI.
 #pragma once
 
+#include "qm_db/hingerecords.h"
 #include "qm_db/units.h"
 
 #include <array>
@@ -13,11 +14,23 @@
 /// Six components in the order X, Y, Z, RX, RY, RZ.
 using T_DOF6 = std::array<double, 6>;
 
+/// Names of the design codes that the model is checked by ("Eurocode2:04"); absent: none chosen.
+struct T_DESIGN_CODES {
+    std::optional<std::string> concrete{};
+    std::optional<std::string> steel{};
+    bool operator==(const T_DESIGN_CODES&) const = default;
+};
+
 /// Structure type: what holds for the whole model.
 struct T_STYP_D {
     std::string title;
-    T_UNITS units;                 // current units of the document
-    std::optional<double> gravity; // m/s2 in the store; absent: 9.80665 m/s2
+    T_UNITS units;                   // current units of the document
+    std::optional<double> gravity{}; // m/s2 in the store; absent: 9.80665 m/s2
+    T_DESIGN_CODES designCodes{};
+    // Options of plastic hinges.
+    bool alternativeHysteresis = false;   // alternative hysteresis models are in use
+    bool wallStrengthDegradation = false; // wall types offer the strength degradation curve
+    bool gsd = false;                     // My and Mz offer the section-based curve
     bool operator==(const T_STYP_D&) const = default;
 };
 
@@ -108,13 +121,37 @@ inline constexpr std::array<const char*, 6> kDirectionNames{"DX", "DY", "DZ", "R
 inline constexpr std::array<const char*, 4> kPatternNames{"static", "acceleration", "mode",
                                                           "mode x story mass"};
 
+/// One row of a load case's pattern list.
+struct T_POLC_PATTERN {
+    int kind = 0;        // 0 static load case, 1 uniform acceleration, 2 mode, 3 mode x storey mass
+    int number = 0;      // key of the static load case, direction 1 to 3, or mode number
+    double factor = 1.0; // scale factor, not 0
+    bool operator==(const T_POLC_PATTERN&) const = default;
+};
+
+/// How the solver increments a load case and when it stops.
+struct T_POLC_CONTROL {
+    int incrementMethod = 1;          // 1 displacement control, else force control
+    int incrementOption = 0;          // 2: increments follow an increment function
+    int incrementFunction = 0;        // its key
+    double stiffnessRatioLimit = 0.0; // current stiffness / initial stiffness, stop criterion
+    bool generateStaticAngle = false;
+    double staticAngle = 0.0; // degrees
+    bool masterNodeControl = true;
+    double masterMaxDispl = 0.0; // of the master node, length; sign gives the direction
+    double maxTransDispl = 0.0;  // largest translation of any node, length
+    bool operator==(const T_POLC_CONTROL&) const = default;
+};
+
 /// Pushover load case.
 struct T_POLC_D {
     std::string name;
-    int controlNode = 0;    // node whose displacement is followed
-    int direction = 1;      // 1 to 6: DX, DY, DZ, RX, RY, RZ
-    int patternKind = 0;    // kind of the master load pattern, 0 to 3
-    std::vector<int> modes; // mode numbers that the pattern names, in order
+    int controlNode = 0;                     // node whose displacement is followed
+    int direction = 1;                       // 1 to 6: DX, DY, DZ, RX, RY, RZ
+    int patternKind = 0;                     // kind of the master load pattern, 0 to 3
+    std::vector<int> modes;                  // mode numbers that the pattern names, in order
+    std::vector<T_POLC_PATTERN> patterns{};  // pattern rows, may be empty
+    std::optional<T_POLC_CONTROL> control{}; // absent for a case from another solver
     bool operator==(const T_POLC_D&) const = default;
 };
 
@@ -162,12 +199,19 @@ using T_TABLE = std::map<int, T>;
 /// The whole model but its results, in SI.
 struct T_MODEL {
     T_STYP_D styp;
-    T_TABLE<T_NODE_D> nodes;       // by node id
-    T_TABLE<T_STOR_D> storeys;     // 1, 2, ... bottom to top
-    T_TABLE<T_EIGV_D> modes;       // by mode number
-    T_TABLE<T_SPFC_D> spectra;     // 1, 2, ... in the order of definition
-    T_TABLE<T_POLC_D> pushovers;   // likewise
-    T_TABLE<T_EVAL_D> evaluations; // likewise
-    T_TABLE<T_POVR_D> poverSteps;  // by the key of the pushover load case
+    T_TABLE<T_NODE_D> nodes;              // by node id
+    T_TABLE<T_STOR_D> storeys;            // 1, 2, ... bottom to top
+    T_TABLE<T_EIGV_D> modes;              // by mode number
+    T_TABLE<T_SPFC_D> spectra;            // 1, 2, ... in the order of definition
+    T_TABLE<T_POLC_D> pushovers;          // likewise
+    T_TABLE<T_EVAL_D> evaluations;        // likewise
+    T_TABLE<T_POVR_D> poverSteps;         // by the key of the pushover load case
+    T_TABLE<T_MATL_D> materials;          // 1, 2, ... in the order of definition
+    T_TABLE<T_SECT_D> sections;           // likewise
+    T_TABLE<T_ELEM_D> elements;           // by element id
+    T_TABLE<T_PHGT_D> hingeTypes;         // 1, 2, ... in the order of definition
+    T_TABLE<T_PHGE_D> hinges;             // likewise
+    T_TABLE<T_IEHP_D> inelasticHinges;    // likewise
+    T_TABLE<T_POFC_D> incrementFunctions; // likewise
     bool operator==(const T_MODEL&) const = default;
 };

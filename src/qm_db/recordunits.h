@@ -4,6 +4,10 @@
 
 #include "qm_db/records.h"
 
+#include <functional>
+
+using QuantityFn = std::function<void(double& value, T_DIM dim)>;
+
 template <class F>
 void ForEachQuantity(T_STYP_D& r, F&& f)
 {
@@ -32,13 +36,25 @@ void ForEachQuantity(T_SPFC_D& r, F&& f)
         f(*user->gravity, kDimAccel);
 }
 
-// Mode shapes are in the normalisation of their source; evaluations and load cases hold no lengths.
+// Plastic deformations have the dimension of the component's deformation, ratios D / Dy none.
+void ForEachQuantity(T_MATL_D& r, const QuantityFn& f);
+void ForEachQuantity(T_SECT_D& r, const QuantityFn& f);
+void ForEachQuantity(T_PHGT_D& r, const QuantityFn& f);
+void ForEachQuantity(T_PHGE_D& r, const QuantityFn& f);
+void ForEachQuantity(T_IEHP_D& r, const QuantityFn& f);
+void ForEachQuantity(T_POLC_D& r, const QuantityFn& f);
+
+// Mode shapes are in the normalisation of their source; the others hold no lengths.
 template <class F>
 void ForEachQuantity(T_EIGV_D&, F&&)
 {
 }
 template <class F>
-void ForEachQuantity(T_POLC_D&, F&&)
+void ForEachQuantity(T_ELEM_D&, F&&)
+{
+}
+template <class F>
+void ForEachQuantity(T_POFC_D&, F&&)
 {
 }
 template <class F>

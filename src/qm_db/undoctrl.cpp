@@ -8,7 +8,7 @@ namespace {
 constexpr std::size_t kMaxSteps = 200;
 
 template <class T>
-void ApplyOne(T_MODEL& model, int key, const std::optional<T>& value)
+void ApplyOne(T_MODEL& model, int key, const std::shared_ptr<const T>& value)
 {
     if constexpr (std::is_same_v<T, T_STYP_D>) {
         if (value) model.styp = *value;

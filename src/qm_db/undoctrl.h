@@ -3,22 +3,24 @@
 
 #include "qm_db/datactrl.h"
 
-#include <optional>
+#include <memory>
 #include <string>
 #include <variant>
 #include <vector>
 
-/// One record before and after; absent means that it did not exist.
+/// One record before and after; null means that it did not exist.
 template <class T>
 struct T_CHANGE {
     int key = 0;
-    std::optional<T> before;
-    std::optional<T> after;
+    std::shared_ptr<const T> before; // apart, so that a change of a node is not as large as one
+    std::shared_ptr<const T> after;  // of a hinge type
 };
 
 using T_CHANGE_ANY =
     std::variant<T_CHANGE<T_STYP_D>, T_CHANGE<T_NODE_D>, T_CHANGE<T_STOR_D>, T_CHANGE<T_EIGV_D>,
-                 T_CHANGE<T_SPFC_D>, T_CHANGE<T_POLC_D>, T_CHANGE<T_EVAL_D>>;
+                 T_CHANGE<T_SPFC_D>, T_CHANGE<T_POLC_D>, T_CHANGE<T_EVAL_D>, T_CHANGE<T_MATL_D>,
+                 T_CHANGE<T_SECT_D>, T_CHANGE<T_ELEM_D>, T_CHANGE<T_PHGT_D>, T_CHANGE<T_PHGE_D>,
+                 T_CHANGE<T_IEHP_D>, T_CHANGE<T_POFC_D>>;
 
 /// What one command of the user changed.
 struct T_UNDO_STEP {

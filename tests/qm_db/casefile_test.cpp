@@ -1,5 +1,6 @@
 #include "qm_db/casefile.h"
 
+#include "qm_base/textformat.h"
 #include "qm_db/filectrl.h"
 #include "qm_db/jsonnumber.h"
 
@@ -350,17 +351,18 @@ TEST(CaseFile, KeepsTheDigitsOfTheFile)
 TEST(CaseFile, PrintsNoMoreDigitsThanTheFileHad)
 {
     std::mt19937_64 random(7);
-    const T_UNITS units{FORCE_UNIT::kips, LENGTH_UNIT::in};
-    for (int i = 0; i < 20000; ++i) {
-        const auto digits = static_cast<long long>(1 + random() % 9'999'999'999'999'999ULL);
-        const std::string text = "1." + std::to_string(digits); // 2 to 17 digits
-        const double value = std::stod(text);
-        const std::string shortest = NumberText(value);
-        const double si = ToSi(value, units, kDimForce);
-        const std::string printed = SiText(si, units, kDimForce).value();
-        EXPECT_EQ(si, ToSi(std::stod(printed), units, kDimForce));
-        EXPECT_LE(printed.size(), shortest.size());
-        if (shortest.size() <= 16) EXPECT_EQ(shortest, printed);
+    for (int i = 0; i < 35000; ++i) {
+        const T_UNITS units{static_cast<FORCE_UNIT>(i % 7), static_cast<LENGTH_UNIT>(i / 7 % 5)};
+        const auto fraction = static_cast<double>(random() >> 11) * 0x1p-53;
+        const double value = std::stod(FormatText("%.*e", 12 + i % 5, 1.0 + 9.0 * fraction));
+        const std::string text = NumberText(value); // 13 to 17 digits
+        const double si = ToSi(value, units, kDimMass);
+        const std::string printed = SiText(si, units, kDimMass).value();
+        EXPECT_EQ(si, ToSi(std::stod(printed), units, kDimMass));
+        EXPECT_LE(printed.size(), text.size());
+        if (text.size() <= 16) { // 15 digits and the point
+            EXPECT_EQ(text, printed);
+        }
     }
     EXPECT_EQ("100000", NumberText(100000));
     EXPECT_EQ("-0.00001", NumberText(-0.00001));
@@ -434,7 +436,7 @@ TEST(CaseFile, RefusesToPrintWhatCouldNotBeRead)
              c.model.modes.erase(1);
          }},
         {"title: a text is not valid UTF-8",
-         [](T_MODEL_CONTENT& c) { c.model.styp.title = "\xff"; }},
+         [](T_MODEL_CONTENT& c) { c.model.styp.title.assign(1, '\xff'); }},
         {"pushover[1].direction: no name for the value 6",
          [](T_MODEL_CONTENT& c) { c.model.pushovers.at(2).direction = 7; }},
         {"pushover[1].steps: the load case \"RZ\" has no results, which a case file can't leave "

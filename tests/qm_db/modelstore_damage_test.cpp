@@ -1,5 +1,6 @@
 #include "modelstoresample.h"
 #include "qm_base/msgfunction.h"
+#include "qm_db/modelreader.h"
 #include "qm_db/modelstore.h"
 #include "qm_db/sqlitedb.h"
 
@@ -156,7 +157,7 @@ TEST_F(ModelStoreDamage, EmptyForeignAndNewerFilesSayWhatTheyAre)
         {"one byte", "x", Message("IDS_QM_DB_FILE_FOREIGN")},
         {"large text", std::string(10000, 'a'), Message("IDS_QM_DB_FILE_FOREIGN")},
         {"other application", other, Message("IDS_QM_DB_FILE_OTHER_APP")},
-        {"newer", newer, Message("IDS_QM_DB_FILE_NEWER", "7", "1")},
+        {"newer", newer, Message("IDS_QM_DB_FILE_NEWER", "7", "2")},
         {"wal", wal,
          Message("IDS_QM_DB_FILE_DAMAGED", MMSGFunction::GetValue("IDS_QM_DB_DAMAGE_HEADER"))},
     };
@@ -170,25 +171,49 @@ TEST_F(ModelStoreDamage, EmptyForeignAndNewerFilesSayWhatTheyAre)
 
 TEST_F(ModelStoreDamage, OtherTablesUnderOurMarkAreRefused)
 {
+    constexpr const char* kReversed = "UPDATE result_blocks SET step = step + 10 WHERE part = 3;"
+                                      "UPDATE result_blocks SET step = 12 - step WHERE part = 3";
+    constexpr const char* kNan = "UPDATE arrays SET data = x'000000000000F87F000000000000F03F' "
+                                 "WHERE owner = 'spectra' AND key = 10 AND name = 'Sa'";
+    constexpr const char* kTrigger =
+        "CREATE TRIGGER t AFTER INSERT ON modes BEGIN DELETE FROM modes; END";
     const struct {
         const char* label;
         const char* sql;
+        bool sumsToo; // refused even with new checksums
     } cases[] = {
-        {"table missing", "DROP TABLE result_blocks"},
-        {"another table", "CREATE TABLE extra(a)"},
-        {"a trigger", "CREATE TRIGGER t AFTER INSERT ON modes BEGIN DELETE FROM modes; END"},
-        {"row missing", "DELETE FROM evaluations WHERE key = 2"},
-        {"node chunk missing", "DELETE FROM arrays WHERE owner = 'nodes'"},
-        {"block missing", "DELETE FROM result_blocks WHERE part = 3 AND step = 1"},
-        {"blocks exchanged", "UPDATE result_blocks SET step = step + 10 WHERE part = 3; "
-                             "UPDATE result_blocks SET step = 12 - step WHERE part = 3"},
-        {"sum missing", "DELETE FROM checksums WHERE name = 'modes'"},
+        {"table missing", "DROP TABLE result_blocks", false},
+        {"another table", "CREATE TABLE extra(a)", true},
+        {"a trigger", kTrigger, true},
+        {"record missing", "DELETE FROM evaluations WHERE key = 2", false},
+        {"nodes missing", "DELETE FROM arrays WHERE owner = 'nodes' AND name = 'mass'", true},
+        {"node places missing", "DELETE FROM arrays WHERE owner = 'nodes' AND name = 'xyz'", true},
+        {"not a number", kNan, true},
+        {"block missing", "DELETE FROM result_blocks WHERE part = 3 AND step = 1", true},
+        {"blocks without a head", "DELETE FROM results WHERE key = 3", true},
+        {"blocks reversed", kReversed, true},
+        {"model missing", "DELETE FROM model", true},
+        {"unknown unit", "UPDATE model SET force_unit = 'stone'", true},
+        {"unknown method", "UPDATE evaluations SET method = 9", true},
+        {"sum missing", "DELETE FROM checksums WHERE name = 'modes'", false},
     };
     for (const auto& c : cases) {
         WriteBytes(m_path, m_bytes);
         CSqliteDb::OpenForWriting(m_path).Exec(c.sql);
         ExpectRefused(c.label);
+        if (c.sumsToo) WriteChecksums(CSqliteDb::OpenForWriting(m_path));
+        ExpectRefused(c.label);
     }
+}
+
+/// A journal of that name is no business of ours: replaying it would change or refuse the file.
+TEST_F(ModelStoreDamage, JournalBesideTheFileIsLeftAlone)
+{
+    const std::string journal = "\xd9\xd5\x05\xf9\x20\xa1\x63\xd7" + std::string(1016, '\1');
+    WriteBytes(m_path + "-journal", journal);
+    ASSERT_EQ(1, Open()) << m_error.text;
+    EXPECT_TRUE(SameContent(RichContent(), m_content));
+    EXPECT_TRUE(journal == BytesOf(m_path + "-journal"));
 }
 
 TEST_F(ModelStoreDamage, MissingFilesAndFoldersAreNoAccess)

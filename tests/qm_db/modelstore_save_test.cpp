@@ -15,6 +15,7 @@
 #include <unistd.h>
 
 namespace fs = std::filesystem;
+using zql::lib::MMSGFunction;
 
 namespace {
 
@@ -88,7 +89,8 @@ TEST_F(ModelStoreSave, NumbersThatAreNotFiniteAreRefused)
             T_MODEL_CONTENT content = RichContent();
             c.spoil(content, value);
             ExpectRefused(content, FILE_FAULT::BadInput, c.place);
-            EXPECT_NE(std::string::npos, m_error.text.find(c.place)) << m_error.text;
+            EXPECT_EQ(MMSGFunction::Format("IDS_QM_DB_FILE_NOT_FINITE", {m_path, c.place}),
+                      m_error.text);
         }
     }
 }
@@ -98,8 +100,8 @@ TEST_F(ModelStoreSave, ResultsThatDoNotFitAreRefused)
     T_MODEL_CONTENT content = RichContent();
     content.results[1] = MakePushResult({{1, 2}, {1, 2}, {{5, {1, 2}}, {6, {1}}}});
     ExpectRefused(content, FILE_FAULT::BadInput, "displacements");
-    EXPECT_EQ(zql::lib::MMSGFunction::Format("IDS_QM_DB_FILE_RESULT_LENGTH",
-                                             {m_path, "results 1 displacement 6", "1", "2"}),
+    EXPECT_EQ(MMSGFunction::Format("IDS_QM_DB_FILE_RESULT_LENGTH",
+                                   {m_path, "results 1 displacement 6", "1", "2"}),
               m_error.text);
     content.results[1] = MakePushResult({{1, 2}, {1}, {}});
     ExpectRefused(content, FILE_FAULT::BadInput, "base reactions");
@@ -162,6 +164,12 @@ TEST_F(ModelStoreSave, KeepsPermissionsAndLinks)
         EXPECT_EQ(mode, status.st_mode & 07777);
     }
     EXPECT_TRUE(fs::is_symlink(link));
+
+    const std::string fresh = m_folder.File("fresh.qmdb");
+    const mode_t before = ::umask(027);
+    EXPECT_EQ(1, CModelStore().Save(fresh, GridContent(2, 2), m_error)) << m_error.text;
+    ::umask(before);
+    EXPECT_EQ(fs::perms(0640), fs::status(fresh).permissions());
     EXPECT_FALSE(m_before == BytesOf(m_path));
 }
 

@@ -172,6 +172,8 @@ TEST_F(ModelStore, SavingUnderANewNameMovesTheLock)
     ASSERT_EQ(1, store.Save(copy, content, m_error)) << m_error.text;
     EXPECT_EQ(0, other.Open(copy, OPEN_MODE::Edit, content, m_error));
     EXPECT_EQ(1, other.Open(m_path, OPEN_MODE::Edit, content, m_error)) << m_error.text;
+    EXPECT_EQ(0, store.Save(m_path, content, m_error)); // the other's now
+    EXPECT_EQ(FILE_FAULT::NoAccess, m_error.fault);
 }
 
 TEST_F(ModelStore, RefusesAnEditorInAnotherProcess)
@@ -199,6 +201,11 @@ TEST_F(ModelStore, RefusesAnEditorInAnotherProcess)
 TEST_F(ModelStore, OpensInAReadOnlyFolderAndLeavesNothingThere)
 {
     Save(RichContent(), m_path);
+    const std::string shared = m_folder.File("shared"); // a folder that anybody may write
+    fs::create_directory(shared);
+    fs::permissions(shared, fs::perms(0777));
+    Save(RichContent(), shared + "/frame.qmdb");
+    fs::permissions(shared + "/frame.qmdb", fs::perms(0444));
     fs::permissions(m_path, fs::perms(0444));
     fs::permissions(m_folder.Path(), fs::perms(0555));
     const pid_t child = ::fork();
@@ -211,6 +218,8 @@ TEST_F(ModelStore, OpensInAReadOnlyFolderAndLeavesNothingThere)
         const bool refused = !CModelStore().Save(m_path, read, error) &&
                              error.fault == FILE_FAULT::NoAccess &&
                              !CModelStore().Save(m_folder.File("new.qmdb"), read, error) &&
+                             error.fault == FILE_FAULT::NoAccess &&
+                             !CModelStore().Save(shared + "/frame.qmdb", read, error) &&
                              error.fault == FILE_FAULT::NoAccess;
         ::_exit((plain ? 1 : 0) + (same ? 2 : 0) + (refused ? 4 : 0));
     }
@@ -218,7 +227,7 @@ TEST_F(ModelStore, OpensInAReadOnlyFolderAndLeavesNothingThere)
     ::waitpid(child, &status, 0);
     ASSERT_TRUE(WIFEXITED(status));
     EXPECT_EQ(7, WEXITSTATUS(status));
-    EXPECT_EQ(std::vector<std::string>{"frame.qmdb"}, m_folder.Names());
+    EXPECT_EQ((std::vector<std::string>{"frame.qmdb", "shared"}), m_folder.Names());
 }
 
 // --- older versions

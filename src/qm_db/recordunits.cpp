@@ -1,0 +1,39 @@
+#include "qm_db/recordunits.h"
+
+#include "qm_db/casequantities.h"
+
+namespace {
+
+template <class R>
+void Visit(R& r, const QuantityFn& f)
+{
+    CCaseQuantities<QuantityFn> quantities(f);
+    CaseFields(quantities, r);
+}
+
+} // namespace
+
+void ForEachQuantity(T_MATL_D& r, const QuantityFn& f)
+{
+    Visit(r, f);
+}
+void ForEachQuantity(T_SECT_D& r, const QuantityFn& f)
+{
+    Visit(r, f);
+}
+void ForEachQuantity(T_PHGT_D& r, const QuantityFn& f)
+{
+    Visit(r, f);
+}
+void ForEachQuantity(T_PHGE_D& r, const QuantityFn& f)
+{
+    Visit(r, f);
+}
+void ForEachQuantity(T_IEHP_D& r, const QuantityFn& f)
+{
+    Visit(r, f);
+}
+void ForEachQuantity(T_POLC_D& r, const QuantityFn& f)
+{
+    Visit(r, f);
+}

@@ -1,0 +1,191 @@
+#include "qm_db/dbdoc.h"
+
+#include <gtest/gtest.h>
+
+namespace {
+
+/// One node, one storey, one spectrum with its own gravity, in SI.
+T_MODEL_CONTENT SmallModel()
+{
+    T_MODEL_CONTENT c;
+    c.model.styp.units = {FORCE_UNIT::kN, LENGTH_UNIT::m};
+    c.model.nodes[1] = {1, {0, 0, 3.048}, {1000, 1000, 1000}, {}};
+    c.model.storeys[1] = {"1F", 3.048, {1}};
+    c.model.spectra[1] = {"U", T_SPFC_USER{{0.0, 1.0}, {0.5, 0.5}, 9.8}};
+    return c;
+}
+
+T_NODE_D NodeOf(CDBDoc& doc, int id)
+{
+    T_NODE_D node;
+    EXPECT_EQ(1, doc.Attr().GetNode(id, node));
+    return node;
+}
+
+void PutNode(CDBDoc& doc, const T_NODE_D& node)
+{
+    ASSERT_EQ(1, doc.Edit().Begin("node"));
+    ASSERT_EQ(1, doc.Edit().Put(node.id, node));
+    ASSERT_EQ(1, doc.Edit().Commit());
+}
+
+} // namespace
+
+TEST(EditData, StepsAreUndoneAndRedoneWhole)
+{
+    CDBDoc doc;
+    doc.Data().Assign(SmallModel());
+    const T_MODEL before = doc.Data().Model();
+
+    ASSERT_EQ(1, doc.Edit().Begin("two things"));
+    EXPECT_EQ(0, doc.Edit().Begin("nested"));
+    ASSERT_EQ(1, doc.Edit().Put(1, T_NODE_D{1, {1, 2, 3}, {4, 5, 6}, {}})); // replaced twice:
+    ASSERT_EQ(1, doc.Edit().Put(1, T_NODE_D{1, {7, 8, 9}, {4, 5, 6}, {}})); // order matters
+    ASSERT_EQ(1, doc.Edit().Put(2, T_NODE_D{2, {0, 0, 6}, {}, {}}));
+    ASSERT_EQ(1, doc.Edit().Erase<T_STOR_D>(1));
+    EXPECT_EQ(0, doc.Edit().Erase<T_STOR_D>(1));
+    ASSERT_EQ(1, doc.Edit().Commit());
+    EXPECT_EQ(0, doc.Edit().Commit());
+    const T_MODEL after = doc.Data().Model();
+    EXPECT_EQ(7.0, after.nodes.at(1).xyz[0]);
+    EXPECT_TRUE(after.nodes.contains(2) && after.storeys.empty());
+    EXPECT_TRUE(doc.Data().IsModified());
+
+    EXPECT_EQ("two things", doc.Undo().UndoTitle());
+    ASSERT_EQ(1, doc.Undo().Undo());
+    EXPECT_EQ(before, doc.Data().Model());
+    EXPECT_EQ(0, doc.Undo().Undo());
+    ASSERT_EQ(1, doc.Undo().Redo());
+    EXPECT_EQ(after, doc.Data().Model());
+    EXPECT_EQ(0, doc.Undo().Redo());
+}
+
+TEST(EditData, ANewEditForgetsWhatWasUndoneAndAnEmptyStepDoesNot)
+{
+    CDBDoc doc;
+    doc.Data().Assign(SmallModel());
+    PutNode(doc, {2, {0, 0, 6}, {}, {}});
+    ASSERT_EQ(1, doc.Undo().Undo());
+    ASSERT_EQ(1, doc.Edit().Begin("nothing"));
+    ASSERT_EQ(1, doc.Edit().Commit());
+    EXPECT_TRUE(doc.Undo().CanRedo());
+    EXPECT_FALSE(doc.Undo().CanUndo());
+    PutNode(doc, {3, {0, 0, 9}, {}, {}});
+    EXPECT_FALSE(doc.Undo().CanRedo());
+}
+
+TEST(EditData, TwoHundredStepsAreKept)
+{
+    CDBDoc doc;
+    doc.Data().Assign(SmallModel());
+    for (int i = 1; i <= 205; ++i)
+        PutNode(doc, {1, {0, 0, 1.0 * i}, {}, {}});
+    int undone = 0;
+    while (doc.Undo().Undo())
+        ++undone;
+    EXPECT_EQ(200, undone);
+    EXPECT_EQ(5.0, NodeOf(doc, 1).xyz[2]); // the five oldest steps stay
+}
+
+TEST(EditData, RollbackRestoresEveryRecord)
+{
+    CDBDoc doc;
+    doc.Data().Assign(SmallModel());
+    const T_MODEL before = doc.Data().Model();
+    ASSERT_EQ(1, doc.Edit().Begin("half"));
+    ASSERT_EQ(1, doc.Edit().Put(1, T_NODE_D{1, {1, 1, 1}, {}, {}}));
+    ASSERT_EQ(1, doc.Edit().Put(1, T_NODE_D{1, {2, 2, 2}, {}, {}}));
+    ASSERT_EQ(1, doc.Edit().Erase<T_STOR_D>(1));
+    ASSERT_EQ(1, doc.Edit().PutStyp({"new", {FORCE_UNIT::N, LENGTH_UNIT::mm}, 9810.0}));
+    doc.Edit().Rollback();
+    EXPECT_EQ(before, doc.Data().Model());
+    EXPECT_FALSE(doc.Undo().CanUndo());
+    EXPECT_FALSE(doc.Edit().IsOpen());
+}
+
+TEST(EditData, RefusesWithoutAnOpenStepAndChangesNothing)
+{
+    CDBDoc doc;
+    doc.Data().Assign(SmallModel());
+    const T_MODEL before = doc.Data().Model();
+    EXPECT_EQ(0, doc.Edit().Put(9, T_NODE_D{}));
+    EXPECT_EQ(0, doc.Edit().PutStyp({}));
+    EXPECT_EQ(0, doc.Edit().Erase<T_NODE_D>(1));
+    EXPECT_EQ(before, doc.Data().Model());
+    EXPECT_FALSE(doc.Undo().CanUndo());
+}
+
+// A refused edit must not make the document ask to be saved.
+TEST(EditData, ARefusedEditLeavesTheDocumentUnmodified)
+{
+    CDBDoc doc;
+    doc.Data().Assign(SmallModel());
+    const long revision = doc.Data().Revision();
+    EXPECT_EQ(0, doc.Edit().Put(9, T_NODE_D{}));
+    EXPECT_EQ(0, doc.Edit().Erase<T_NODE_D>(1));
+    EXPECT_FALSE(doc.Data().IsModified());
+    EXPECT_EQ(revision, doc.Data().Revision());
+}
+
+TEST(EditData, ChangingUnitsChangesNoStoredValueAndEveryGivenOne)
+{
+    CDBDoc doc;
+    doc.Data().Assign(SmallModel());
+    const T_MODEL before = doc.Data().Model();
+    ASSERT_EQ(1, doc.Edit().Begin("units"));
+    ASSERT_EQ(1, doc.Edit().PutStyp({"", {FORCE_UNIT::kips, LENGTH_UNIT::ft}, 32.0}));
+    ASSERT_EQ(1, doc.Edit().Commit());
+    EXPECT_EQ(before.nodes, doc.Data().Model().nodes);
+    EXPECT_EQ(before.storeys, doc.Data().Model().storeys);
+    EXPECT_EQ(before.spectra, doc.Data().Model().spectra);
+    EXPECT_DOUBLE_EQ(32.0 * 0.3048, *doc.Data().Model().styp.gravity);
+
+    const T_NODE_D node = NodeOf(doc, 1);
+    EXPECT_DOUBLE_EQ(10.0, node.xyz[2]);         // 3.048 m
+    EXPECT_NEAR(0.06852177, node.mass[0], 5e-9); // 1000 kg in kip s2/ft (a slug is 14.59390 kg)
+    T_SPFC_D spectrum;
+    ASSERT_EQ(1, doc.Attr().GetSpfc(1, spectrum));
+    EXPECT_DOUBLE_EQ(9.8 / 0.3048, *std::get<T_SPFC_USER>(spectrum.data).gravity);
+    T_STYP_D styp;
+    ASSERT_EQ(1, doc.Attr().GetStyp(styp));
+    EXPECT_DOUBLE_EQ(32.0, *styp.gravity);
+    EXPECT_NEAR(32.17405, doc.Init().DefaultGravity(), 5e-6); // standard gravity in ft/s2
+    EXPECT_DOUBLE_EQ(10.0, doc.Unit().ConvertUnitLengthOut(3.048));
+    EXPECT_DOUBLE_EQ(3.048, doc.Unit().ConvertUnitLengthIn(10.0));
+
+    PutNode(doc, {2, {0, 0, 20}, {}, {}}); // values are taken in current units
+    EXPECT_DOUBLE_EQ(6.096, doc.Data().Model().nodes.at(2).xyz[2]);
+}
+
+TEST(EditData, RecordsAreFoundByNameAndLeaveTheOutputAloneWhenMissing)
+{
+    CDBDoc doc;
+    T_MODEL_CONTENT c = SmallModel();
+    c.model.pushovers[4].name = "PX";
+    doc.Data().Assign(c);
+    int key = 77;
+    EXPECT_EQ(0, doc.Attr().FindPolc("px", key));
+    EXPECT_EQ(0, doc.Attr().FindSpfc("PX", key));
+    EXPECT_EQ(77, key);
+    EXPECT_EQ(1, doc.Attr().FindPolc("PX", key));
+    EXPECT_EQ(4, key);
+    T_NODE_D node;
+    node.id = 5;
+    std::array<int, 6> restraint{9, 9, 9, 9, 9, 9};
+    EXPECT_EQ(0, doc.Attr().GetNode(2, node));
+    EXPECT_EQ(0, doc.Attr().GetConsNode(2, restraint));
+    EXPECT_EQ(5, node.id);
+    EXPECT_EQ(9, restraint[0]);
+}
+
+TEST(DbDoc, TheCurrentDocumentIsTheLatestUntilItEnds)
+{
+    EXPECT_EQ(nullptr, CDBDoc::GetDocPoint());
+    CDBDoc first;
+    {
+        CDBDoc second;
+        EXPECT_EQ(&second, CDBDoc::GetDocPoint());
+        CDBDoc::SetDocPoint(&first);
+    }
+    EXPECT_EQ(&first, CDBDoc::GetDocPoint());
+}

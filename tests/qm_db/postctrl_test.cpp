@@ -1,0 +1,258 @@
+#include "qm_db/dbdoc.h"
+#include "qm_db/storyload.h"
+
+#include <gtest/gtest.h>
+
+namespace {
+
+/// Results whose reads can be made to fail.
+class CFailingResult : public IPushResult {
+public:
+    int StepCount() const override { return 1; }
+    std::vector<int> NodeIds() const override { return {11}; }
+    bool HasNode(int node) const override { return node == 11; }
+    int ReadLoadFactors(std::vector<double>& out) override
+    {
+        out.clear();
+        return 0;
+    }
+    int ReadBaseReactions(std::vector<double>& out) override { return ReadLoadFactors(out); }
+    int ReadDisplacements(int, std::vector<double>& out) override { return ReadLoadFactors(out); }
+    std::string Error() const override { return "block damaged"; }
+};
+
+/// Two storeys of 3 m and 4 m with two nodes each and unequal masses; node 30 is in no storey.
+/// Two steps; SI, shown in kN and m.
+T_MODEL_CONTENT TwoStoreys()
+{
+    T_MODEL_CONTENT c;
+    T_MODEL& m = c.model;
+    m.nodes[11] = {11, {0, 0, 3}, {1000, 1000, 0}, {}};
+    m.nodes[12] = {12, {5, 0, 3}, {3000, 1000, 0}, {}};
+    m.nodes[21] = {21, {0, 0, 7}, {4000, 1000, 0}, {}};
+    m.nodes[22] = {22, {5, 0, 7}, {1000, 1000, 0}, {0, 1, 0, 0, 0, 0}};
+    m.nodes[30] = {30, {9, 0, 7}, {8000, 8000, 8000}, {}};
+    m.storeys[1] = {"1F", 3.0, {11, 12}};
+    m.storeys[2] = {"2F", 4.0, {22, 21}};
+    m.pushovers[1].name = "PX";
+    c.results[1] = MakePushResult({{1, 2},
+                                   {-100e3, -150e3},
+                                   {{11, {0.012, -0.030}},
+                                    {12, {0.020, -0.042}},
+                                    {21, {0.040, -0.060}},
+                                    {22, {0.030, -0.070}}}});
+    return c;
+}
+
+} // namespace
+
+TEST(PostCtrl, ReadsStepsInCurrentUnits)
+{
+    CDBDoc doc;
+    T_MODEL_CONTENT c = TwoStoreys();
+    c.model.styp.units = {FORCE_UNIT::N, LENGTH_UNIT::mm};
+    doc.Data().Assign(c);
+    CPostCtrl& post = doc.Post();
+    EXPECT_EQ(0, post.SelectPushover(2));
+    ASSERT_EQ(1, post.SelectPushover(1));
+    EXPECT_EQ(2, post.GetStepCount());
+    double value = -1.0;
+    EXPECT_EQ(0, post.GetReacNew(value)); // no step chosen yet
+    EXPECT_EQ(0, post.GetDispNew(11, value));
+    EXPECT_EQ(0, post.SelectStep(0));
+    EXPECT_EQ(0, post.SelectStep(3));
+    ASSERT_EQ(1, post.SelectStep(2));
+    EXPECT_EQ(0, post.GetDispNew(30, value));
+    EXPECT_FALSE(post.ExistNodePost(30));
+    EXPECT_EQ(-1.0, value);
+    ASSERT_EQ(1, post.GetReacNew(value));
+    EXPECT_DOUBLE_EQ(-150e3, value);
+    ASSERT_EQ(1, post.GetStepFactor_PO(value));
+    EXPECT_EQ(2.0, value);
+    ASSERT_EQ(1, post.GetDispNew(11, value));
+    EXPECT_DOUBLE_EQ(-30.0, value);
+
+    // A change of units reaches values that were read before.
+    ASSERT_EQ(1, doc.Edit().Begin("units"));
+    ASSERT_EQ(1, doc.Edit().PutStyp({"", {FORCE_UNIT::kN, LENGTH_UNIT::cm}, {}}));
+    ASSERT_EQ(1, doc.Edit().Commit());
+    ASSERT_EQ(1, post.SelectPushover(1));
+    ASSERT_EQ(1, post.SelectStep(2));
+    ASSERT_EQ(1, post.GetDispNew(11, value));
+    EXPECT_DOUBLE_EQ(-3.0, value);
+    ASSERT_EQ(1, post.GetReacNew(value));
+    EXPECT_DOUBLE_EQ(-150.0, value);
+}
+
+// Step 1 by hand. Means: 1F 0.016, 2F 0.035; drifts 0.016/3 = 0.0053333, 0.019/4 = 0.00475.
+// Centres of mass: 1F (1*0.012 + 3*0.020)/4 = 0.018, 2F (4*0.040 + 1*0.030)/5 = 0.038; drifts
+// 0.006 and 0.005. Step 2: means -0.036 and -0.065, drifts 0.012 and 0.00725; centres -0.039 and
+// -0.062, drifts 0.013 and 0.00575.
+TEST(PostCtrl, StoreyDriftIsByMeanAndByCentreOfMass)
+{
+    CDBDoc doc;
+    T_MODEL_CONTENT c = TwoStoreys();
+    doc.Data().Assign(c);
+    double kind1 = -1.0, kind2 = -1.0;
+    ASSERT_EQ(1, doc.Post().GetPushoverStoryDriftRatio(1, 1, kind1, kind2));
+    EXPECT_DOUBLE_EQ(0.016 / 3, kind1);
+    EXPECT_DOUBLE_EQ(0.006, kind2);
+    ASSERT_EQ(1, doc.Post().GetPushoverStoryDriftRatio(1, 2, kind1, kind2));
+    EXPECT_DOUBLE_EQ(0.012, kind1);
+    EXPECT_DOUBLE_EQ(0.013, kind2);
+
+    c.model.styp.units = {FORCE_UNIT::kips, LENGTH_UNIT::in}; // a ratio has no unit
+    c.model.storeys[1].height = 6.0;                          // now the upper storey governs
+    doc.Data().Assign(c);
+    ASSERT_EQ(1, doc.Post().GetPushoverStoryDriftRatio(1, 1, kind1, kind2));
+    EXPECT_NEAR(0.00475, kind1, 1e-15);
+    EXPECT_NEAR(0.005, kind2, 1e-15);
+}
+
+TEST(PostCtrl, StoreyDriftRefusesWhatItCanNotKnow)
+{
+    CDBDoc doc;
+    T_MODEL_CONTENT c = TwoStoreys();
+    doc.Data().Assign(c);
+    double kind1 = -1.0, kind2 = -1.0;
+    EXPECT_EQ(0, doc.Post().GetPushoverStoryDriftRatio(2, 1, kind1, kind2));
+    EXPECT_EQ(0, doc.Post().GetPushoverStoryDriftRatio(1, 0, kind1, kind2));
+    EXPECT_EQ(0, doc.Post().GetPushoverStoryDriftRatio(1, 3, kind1, kind2));
+    c.model.storeys.clear();
+    doc.Data().Assign(c);
+    EXPECT_EQ(0, doc.Post().GetPushoverStoryDriftRatio(1, 1, kind1, kind2));
+    EXPECT_EQ(-1.0, kind1);
+    EXPECT_EQ(-1.0, kind2);
+}
+
+TEST(PostCtrl, NodesWithoutResultsDoNotCountInTheirStorey)
+{
+    CDBDoc doc;
+    T_MODEL_CONTENT c = TwoStoreys();
+    c.results[1] = MakePushResult({{1}, {1}, {{11, {0.012}}, {21, {0.040}}}});
+    doc.Data().Assign(c);
+    double kind1 = -1.0, kind2 = -1.0;
+    ASSERT_EQ(1, doc.Post().GetPushoverStoryDriftRatio(1, 1, kind1, kind2));
+    EXPECT_DOUBLE_EQ(0.007, kind1); // (0.040 - 0.012) / 4
+    EXPECT_DOUBLE_EQ(0.007, kind2);
+}
+
+// A storey without results is not one that stands still: the drift is that of the next known
+// level over the height between.
+TEST(PostCtrl, AStoreyWithoutAnyResultDoesNotCountAsUnmoved)
+{
+    CDBDoc doc;
+    T_MODEL_CONTENT c = TwoStoreys();
+    c.results[1] = MakePushResult({{1}, {1}, {{11, {0.012}}, {12, {0.012}}}});
+    c.model.storeys[1].height = 30.0; // an unmoved second storey would govern
+    doc.Data().Assign(c);
+    double kind1 = -1.0, kind2 = -1.0;
+    ASSERT_EQ(1, doc.Post().GetPushoverStoryDriftRatio(1, 1, kind1, kind2));
+    EXPECT_DOUBLE_EQ(0.0004, kind1);
+    EXPECT_DOUBLE_EQ(0.0004, kind2);
+
+    c.results[1] = MakePushResult({{1}, {1}, {{22, {-0.051}}}});
+    doc.Data().Assign(c);
+    ASSERT_EQ(1, doc.Post().GetPushoverStoryDriftRatio(1, 1, kind1, kind2));
+    EXPECT_DOUBLE_EQ(0.0015, kind1); // 0.051 / (30 + 4)
+    EXPECT_DOUBLE_EQ(0.0015, kind2);
+
+    c.results[1] = MakePushResult({{1}, {1}, {{30, {0.012}}}}); // no storey is known
+    doc.Data().Assign(c);
+    EXPECT_EQ(0, doc.Post().GetPushoverStoryDriftRatio(1, 1, kind1, kind2));
+    EXPECT_DOUBLE_EQ(0.0015, kind1);
+}
+
+TEST(PostCtrl, AnUnreadableLoadCaseDoesNotSpoilTheNextOne)
+{
+    CDBDoc doc;
+    T_MODEL_CONTENT c = TwoStoreys();
+    c.model.pushovers[2].name = "PX2";
+    c.results[2] = std::make_shared<CFailingResult>();
+    doc.Data().Assign(c);
+    double value = -1.0, kind2 = -1.0;
+    ASSERT_EQ(1, doc.Post().SelectPushover(2));
+    ASSERT_EQ(1, doc.Post().SelectStep(1));
+    EXPECT_EQ(0, doc.Post().GetDispNew(11, value));
+    EXPECT_EQ("block damaged", doc.Post().Error());
+    EXPECT_EQ(0, doc.Post().GetReacNew(value));
+    EXPECT_EQ(0, doc.Post().GetPushoverStoryDriftRatio(2, 1, value, kind2));
+    ASSERT_EQ(1, doc.Post().SelectPushover(1));
+    ASSERT_EQ(1, doc.Post().SelectStep(1));
+    EXPECT_EQ(0, doc.Post().GetDispNew(30, value)); // not there; nothing is damaged
+    EXPECT_EQ("", doc.Post().Error());
+    EXPECT_EQ(-1.0, value);
+    EXPECT_EQ(1, doc.Post().GetPushoverStoryDriftRatio(1, 1, value, kind2));
+}
+
+// Three masses 2, 2, 1 (kN s2/m) and the shape 1, 2, 3 in X: L = 2 + 4 + 3 = 9,
+// M = 2 + 8 + 9 = 19, total 5; factor 9/19, mass 100 * 81 / (19 * 5) per cent.
+TEST(PostCtrl, ParticipationFollowsFromMassesUnlessRecorded)
+{
+    CDBDoc doc;
+    T_MODEL_CONTENT c;
+    for (int i = 1; i <= 3; ++i)
+        c.model.nodes[i] = {i, {0, 0, 3.0 * i}, {i < 3 ? 2000.0 : 1000.0, 0, 0}, {}};
+    c.model.modes[1].shape = {{1, {1}}, {2, {2}}, {3, {3}}};
+    c.model.modes[2] = c.model.modes[1];
+    c.model.modes[2].participation = T_DOF6{0.5};
+    c.model.modes[2].massPercent = T_DOF6{80.0};
+    doc.Data().Assign(c);
+    T_MPAF_D factor;
+    T_MPAM_D percent;
+    EXPECT_EQ(2, doc.Post().GetNumEigvPost());
+    ASSERT_EQ(1, doc.Post().GetEiMpafNeutral(1, factor));
+    ASSERT_EQ(1, doc.Post().GetEiMpam(1, percent));
+    EXPECT_DOUBLE_EQ(9.0 / 19.0, factor.factor[0]);
+    EXPECT_DOUBLE_EQ(8100.0 / 95.0, percent.percent[0]);
+    EXPECT_EQ(0.0, factor.factor[1]);
+    ASSERT_EQ(1, doc.Post().GetEiMpafNeutral(2, factor));
+    ASSERT_EQ(1, doc.Post().GetEiMpam(2, percent));
+    EXPECT_EQ(0.5, factor.factor[0]);
+    EXPECT_EQ(80.0, percent.percent[0]);
+    EXPECT_EQ(0, doc.Post().GetEiMpafNeutral(3, factor));
+    EXPECT_EQ(0, doc.Post().GetEiMpam(0, percent));
+
+    T_DOF6 shape{7, 7, 7, 7, 7, 7};
+    EXPECT_EQ(0, doc.Post().SelectMode(3));
+    ASSERT_EQ(1, doc.Post().SelectMode(2));
+    doc.Post().GetEiMode(3, shape);
+    EXPECT_EQ((T_DOF6{3}), shape);
+    doc.Post().GetEiMode(99, shape);
+    EXPECT_EQ(T_DOF6{}, shape);
+}
+
+TEST(PostCtrl, LimitStateStepsAreKeptPerLoadCaseAndCode)
+{
+    CDBDoc doc;
+    doc.Data().Assign(TwoStoreys());
+    CPoverInfo& info = *doc.Post().GetPoverInfo();
+    std::array<int, 3> steps{9, 9, 9};
+    EXPECT_EQ(0, info.GetStepEC8(1, steps));
+    info.SetStepEC8(1, 3, 4, -2);
+    EXPECT_EQ(0, info.GetStepNTC2008(1, steps));
+    EXPECT_EQ((std::array<int, 3>{9, 9, 9}), steps);
+    info.SetStepNTC2008(1, 5, 6, 7);
+    ASSERT_EQ(1, info.GetStepEC8(1, steps));
+    EXPECT_EQ((std::array<int, 3>{3, 4, -2}), steps);
+    ASSERT_EQ(1, info.GetStepNTC2008(1, steps));
+    EXPECT_EQ((std::array<int, 3>{5, 6, 7}), steps);
+    EXPECT_EQ(0, info.GetStepEC8(2, steps));
+}
+
+TEST(StoryLoad, MassesAreThoseOfListedNodesOnceAndFree)
+{
+    CDBDoc doc;
+    T_MODEL_CONTENT c = TwoStoreys();
+    c.model.storeys[2].nodes = {22, 21, 99, 21}; // 99 is not in the model
+    doc.Data().Assign(c);
+    const std::vector<T_NODAL_MASS> masses = CStoryLoad(doc.Data()).Calc_Nodal_Mass();
+    ASSERT_EQ(4U, masses.size()); // not 30, not 99, 21 once
+    EXPECT_EQ(21, masses[2].node);
+    EXPECT_EQ((std::array<double, 3>{4, 1, 0}), masses[2].mass);
+    EXPECT_EQ((std::array<double, 3>{1, 0, 0}), masses[3].mass); // restrained in Y
+
+    c.model.storeys.clear();
+    doc.Data().Assign(c);
+    EXPECT_EQ(5U, CStoryLoad(doc.Data()).Calc_Nodal_Mass().size());
+}
