@@ -58,7 +58,8 @@ double CurveArea(const T_ADRS_VIEW& c, double d)
             const double Sad = c.Sa[i] + w * (c.Sa[i + 1] - c.Sa[i]);
             sum += (Sad + c.Sa[i]) / 2.0 * (d - c.Sd[i]);
         }
-        if (c.Sd[i] > d) break; // a curve that turns back ends with the segment that starts beyond d
+        if (c.Sd[i] > d)
+            break; // a curve that turns back ends with the segment that starts beyond d
     }
     return sum;
 }

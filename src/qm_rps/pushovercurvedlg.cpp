@@ -127,7 +127,11 @@ int CPushOverCurveDlg::CalcPushoverCurve()
     }
     m_curveMade = settings;
     m_curveRevision = m_doc.Data().Revision();
-    if (!made) SetCapacity({m_curve.Displacement(), m_curve.Force()});
+    if (IsSpectral(m_curve.PlotType())) {
+        if (!made) SetCapacity({m_curve.Displacement(), m_curve.Force()});
+    } else {
+        SetCapacity({});
+    }
     WarnAboutCurve();
     return CheckCurve();
 }
@@ -164,8 +168,11 @@ int CPushOverCurveDlg::Evaluate()
     m_result.eval = m_eval;
     m_result.procedure = m_eval.procedure.value_or('A');
     m_result.units = m_doc.Unit().Units();
+    if (m_result.IsTarget())
+        m_result.limitStates = CPushOverTargetEvaluation::EmptyRows(m_eval.method);
+    SetGravity(GetGravity(0), GetGravity(1));
+    PrepareSpectrum();
     if (CalcPushoverCurve()) {
-        PrepareSpectrum();
         m_result.result = m_result.IsTarget() ? UpdateTargetDispData() : UpdatePerformancePoint();
     }
     FillResult();
@@ -413,7 +420,8 @@ void CPushOverCurveDlg::PlotCurve()
     const auto type =
         static_cast<PLOT_TYPE>(m_eval.plotType.value_or(static_cast<int>(m_eval.method)));
     if (type == MethodPlotType()) {
-        m_result.curve = {type, Capacity().Sd, Capacity().Sa};
+        if (m_curveMade)
+            m_result.curve = {m_curve.PlotType(), m_curve.Displacement(), m_curve.Force()};
         return;
     }
     T_PUSH_CURVE_SETTINGS settings;

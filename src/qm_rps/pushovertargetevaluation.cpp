@@ -23,6 +23,12 @@ std::vector<T_LIMIT_ROW> NamedRows(std::initializer_list<const char*> names)
 
 } // namespace
 
+std::vector<T_LIMIT_ROW> CPushOverTargetEvaluation::EmptyRows(PUSH_METHOD method)
+{
+    return method == PUSH_METHOD::Ec8Opcm ? NamedRows({"DL", "SD", "NC"})
+                                          : NamedRows({"SLO", "SLD", "SLV", "SLC"});
+}
+
 CPushOverTargetEvaluation::CPushOverTargetEvaluation(T_TARGET_INPUT input) : m_in(std::move(input))
 {
     m_fromOrigin = m_in.capacity;
@@ -125,6 +131,10 @@ int CPushOverTargetEvaluation::UpdateTargetDispDataEC8()
     m_rows = NamedRows({"DL", "SD", "NC"});
     m_demandSteps.assign(3, kStepNone);
     if (!CalcBilinear()) return 0;
+    if (!m_in.spectra[0].SaAt) {
+        m_outcome = {PUSH_OUTCOME::NoTarget, 0};
+        return 0;
+    }
     m_targets = {CalcTarget(m_in.spectra[0], true)};
     const T_TARGET_DISP& t = m_targets.front();
     if (t.found) { // EN 1998-3: damage limitation, significant damage, near collapse

@@ -25,6 +25,9 @@ class CPushOverTargetEvaluation {
 public:
     explicit CPushOverTargetEvaluation(T_TARGET_INPUT input);
 
+    /// Rows of a method without any value.
+    static std::vector<T_LIMIT_ROW> EmptyRows(PUSH_METHOD method);
+
     /// Eurocode 8 limit states without and with the masonry capacity side. 1 a target was found;
     /// 0 none, the rows stay empty.
     [[nodiscard]] int UpdateTargetDispDataEC8();

@@ -1,0 +1,36 @@
+// Model of the editor of bilinear, trilinear, slip and compression-only skeleton curves.
+// Both sides hold magnitudes; units as the caller's.
+#pragma once
+
+#include "qm_base/mdialog.h"
+#include "qm_rps/hingefindings.h"
+
+class CPO_HingeSkcvTabDlg : public zql::frx::MDialog {
+public:
+    /// 1 done; 0 the component has other curves.
+    [[nodiscard]] int Data2Dlg(HINGE_COMPONENT c, const T_HINGE_COMPONENT& data);
+    /// Checks, then writes back, symmetric curves copied to the negative side. 0: `data` as it was.
+    [[nodiscard]] int Dlg2Data(T_HINGE_COMPONENT& data);
+
+    T_HINGE_COMPONENT& Component() { return m_data; }
+    /// The curve of a page, or null before Data2Dlg.
+    T_SKEL_MULTI* Curve(HINGE_END end);
+    std::vector<const char*> PageTitles() const;
+
+    /// Default stiffness reduction ratios: alpha1 and alpha2 for the positive and negative side.
+    void SetDefaultAlpha(HINGE_END end, const T_SIDES<double>& alpha1,
+                         const T_SIDES<double>& alpha2);
+    /// Initial stiffness option; user stiffness values stay.
+    void ChangeInitStiff(HINGE_END end, INIT_STIFFNESS option);
+    /// Which sides have an initial gap; gaps of the others stay as entered and are not checked.
+    void OnChangeSlipInitGap(HINGE_END end, GAP_SIDES sides);
+
+    std::vector<T_FINDING> Findings() const;
+    int CheckData() override;
+    static void CurveFindings(const T_SKEL_MULTI& curve, SKEL_TYPE type, const T_PLACE& place,
+                              std::vector<T_FINDING>& out);
+
+private:
+    HINGE_COMPONENT m_component = HINGE_COMPONENT::Fx;
+    T_HINGE_COMPONENT m_data;
+};

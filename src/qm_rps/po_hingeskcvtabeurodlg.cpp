@@ -1,0 +1,99 @@
+#include "qm_rps/po_hingeskcvtabeurodlg.h"
+
+#include "qm_rps/hingesiderules.h"
+
+namespace {
+
+using B = T_BACKBONE;
+
+// clang-format off
+const T_RULE<B> kStiffness[] = {
+    {{kHingeRuleMessage, RULE_TEXT::Key, "IDS_RPS_PO_PHGT_Initial_Stiffness", nullptr, "sides.pos.userStiffness", HINGE_SIDE::Positive, "", " > 0"},
+     [](const B& b) { return Below(0, b.pos.userStiffness); }, [](const B& b) { return b.initStiffness == INIT_STIFFNESS::User; }},
+    {{kHingeRuleMessage, RULE_TEXT::Key, "IDS_RPS_PO_PHGT_Initial_Stiffness", nullptr, "sides.neg.userStiffness", HINGE_SIDE::Negative, "", " > 0"},
+     [](const B& b) { return Below(0, b.neg.userStiffness); },
+     [](const B& b) { return b.initStiffness == INIT_STIFFNESS::User && !b.symmetric; }},
+};
+// clang-format on
+
+void MirrorCurve(T_SKEL_CURVE& curve)
+{
+    T_SKEL_EC8* e = std::get_if<T_SKEL_EC8>(&curve);
+    if (e && e->symmetric) MirrorSide(e->sides.pos, e->sides.neg);
+}
+
+} // namespace
+
+int CPO_HingeSkcvTabEuroDlg::Data2Dlg(HINGE_COMPONENT c, const T_HINGE_COMPONENT& data)
+{
+    if (data.type != SKEL_TYPE::Ec8 || !std::holds_alternative<T_SKEL_EC8>(data.curves.I) ||
+        !std::holds_alternative<T_SKEL_EC8>(data.curves.J))
+        return 0;
+    m_component = c;
+    m_data = data;
+    return 1;
+}
+
+int CPO_HingeSkcvTabEuroDlg::Dlg2Data(T_HINGE_COMPONENT& data)
+{
+    if (!CheckData()) return 0;
+    T_HINGE_COMPONENT result = m_data;
+    MirrorCurve(result.curves.I);
+    MirrorCurve(result.curves.J);
+    if (result.sameEnds) result.curves.J = result.curves.I;
+    data = std::move(result);
+    return 1;
+}
+
+T_SKEL_EC8* CPO_HingeSkcvTabEuroDlg::Curve(HINGE_END end)
+{
+    const bool j = end == HINGE_END::J && !m_data.sameEnds;
+    return std::get_if<T_SKEL_EC8>(j ? &m_data.curves.J : &m_data.curves.I);
+}
+
+std::vector<const char*> CPO_HingeSkcvTabEuroDlg::PageTitles() const
+{
+    std::vector<const char*> titles;
+    ForEachPage(m_data, [&](HINGE_END end, const T_SKEL_CURVE&) {
+        titles.push_back(PageTitleKey(m_data, end));
+    });
+    return titles;
+}
+
+bool CPO_HingeSkcvTabEuroDlg::IsEurocodePair(const std::string& concreteCode,
+                                             const std::string& steelCode)
+{
+    return (concreteCode == "Eurocode2" || concreteCode == "Eurocode2:04") &&
+           (steelCode == "Eurocode3" || steelCode == "Eurocode3:05");
+}
+
+std::vector<T_FINDING> CPO_HingeSkcvTabEuroDlg::Findings() const
+{
+    std::vector<T_FINDING> out;
+    if (!m_data.active) return out;
+    ForEachPage(m_data, [&](HINGE_END end, const T_SKEL_CURVE& curve) {
+        if (const T_SKEL_EC8* e = std::get_if<T_SKEL_EC8>(&curve))
+            CurveFindings(*e, {static_cast<int>(m_component), end}, out);
+    });
+    return out;
+}
+
+int CPO_HingeSkcvTabEuroDlg::CheckData()
+{
+    const std::vector<T_FINDING> found = Findings();
+    if (found.empty()) return 1;
+    ShowMessage(found.front().messageKey, found.front().text);
+    return 0;
+}
+
+void CPO_HingeSkcvTabEuroDlg::CurveFindings(const T_SKEL_EC8& curve, const T_PLACE& place,
+                                            std::vector<T_FINDING>& out)
+{
+    const B b{curve.sides.pos,    curve.sides.neg, curve.symmetric,
+              curve.strengthLoss, curve.autoYield, curve.measure == SKEL_MEASURE::DDy,
+              curve.initStiffness};
+    for (const T_BACKBONE_RULES& rules :
+         {PositiveSignRules(), NegativeSignRules(), Ec8OrderRules(), AcceptanceRules(),
+          YieldStrengthRules(), T_BACKBONE_RULES(kStiffness)})
+        WalkRules(rules, b, place, out);
+}

@@ -1,0 +1,32 @@
+// Model of the editor of the Eurocode 8 skeleton curve (EN 1998-3: chord rotation, limit states
+// as acceptance criteria). Points follow the FEMA pattern; signs and units as there.
+#pragma once
+
+#include "qm_base/mdialog.h"
+#include "qm_rps/hingefindings.h"
+
+class CPO_HingeSkcvTabEuroDlg : public zql::frx::MDialog {
+public:
+    /// 1 done; 0 the component has other curves.
+    [[nodiscard]] int Data2Dlg(HINGE_COMPONENT c, const T_HINGE_COMPONENT& data);
+    /// Checks, then writes back, symmetric curves mirrored. 0: `data` as it was.
+    [[nodiscard]] int Dlg2Data(T_HINGE_COMPONENT& data);
+
+    T_HINGE_COMPONENT& Component() { return m_data; }
+    /// The curve of a page, or null before Data2Dlg.
+    T_SKEL_EC8* Curve(HINGE_END end);
+    std::vector<const char*> PageTitles() const;
+
+    /// Yield-strength code of the calculation: "Eurocode2", "Eurocode2:04" or "Eurocode3",
+    /// "Eurocode3:05".
+    static bool IsEurocodePair(const std::string& concreteCode, const std::string& steelCode);
+
+    std::vector<T_FINDING> Findings() const;
+    int CheckData() override;
+    static void CurveFindings(const T_SKEL_EC8& curve, const T_PLACE& place,
+                              std::vector<T_FINDING>& out);
+
+private:
+    HINGE_COMPONENT m_component = HINGE_COMPONENT::Fx;
+    T_HINGE_COMPONENT m_data;
+};

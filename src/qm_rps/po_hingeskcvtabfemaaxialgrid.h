@@ -1,0 +1,39 @@
+// Model of the list of axial forces of a FEMA curve that has one backbone per axial force.
+#pragma once
+
+#include "qm_base/mdialog.h"
+#include "qm_db/hingerecords.h"
+
+#include <optional>
+
+class CPO_HingeSkcvTabFemaAxialGrid : public zql::frx::MDialog {
+public:
+    /// Forces, ascending, each with the index of the curve that it had in Data2Dlg (-1: new).
+    struct T_ROW {
+        double axial = 0.0;
+        int source = -1;
+    };
+
+    void Data2Dlg(const std::vector<T_SKEL_AXIAL>& curves);
+    /// The list: curves of kept or changed forces as they are, new forces with `fresh`.
+    void Dlg2Data(std::vector<T_SKEL_AXIAL>& curves, const T_SIDES<T_SKEL_SIDE>& fresh) const;
+    const std::vector<T_ROW>& Rows() const { return m_rows; }
+
+    /// Forces outside [lowest, highest] are refused; without a call every finite force is taken.
+    void SetRange(double lowest, double highest) { m_range = std::pair(lowest, highest); }
+
+    /// 1 done; 0 refused with a message, the list as it was. Forces are compared exactly.
+    [[nodiscard]] int AddForce(double axial);
+    [[nodiscard]] int ChangeForce(double oldAxial, double axial);
+    [[nodiscard]] int RemoveForce(double axial);
+
+private:
+    int Find(double axial) const; // index or -1
+    bool InRange(double axial);
+    void Sort();
+    void Refuse(const char* literal, double axial);
+
+    std::vector<T_SKEL_AXIAL> m_given;
+    std::vector<T_ROW> m_rows;
+    std::optional<std::pair<double, double>> m_range;
+};

@@ -1,0 +1,376 @@
+#include "qm_rps/po_hingeskcvtabfemadlg.h"
+
+#include "qm_base/msgfunction.h"
+#include "qm_base/textformat.h"
+#include "qm_rps/hingemeasure.h"
+#include "qm_rps/hingesiderules.h"
+#include "qm_rps/po_hingefemaenrgdsptgrid.h"
+#include "qm_rps/po_hingeskcvtabfemaaxialgrid.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace {
+
+using B = T_BACKBONE;
+using R = T_RULE<T_BACKBONE>;
+constexpr auto kLit = RULE_TEXT::Literal;
+constexpr auto kKey = RULE_TEXT::Key;
+constexpr auto kPos = HINGE_SIDE::Positive;
+constexpr auto kNeg = HINGE_SIDE::Negative;
+
+bool InUnit(double v)
+{
+    return NotAbove(0, v) && NotAbove(v, 1);
+}
+bool HasRatio(const B& b)
+{
+    return b.fema->dcRatio.has_value();
+}
+bool UserStiffness(const B& b)
+{
+    return b.initStiffness == INIT_STIFFNESS::User;
+}
+
+// clang-format off
+const R kDcRatio[] = {
+    {{"IDS_RPS_Error_Pushove_Hinge_Properties_DC_RATIO", kLit, nullptr, nullptr, "dcRatio.pos", kPos}, [](const B& b) { return InUnit(b.fema->dcRatio->pos); }, HasRatio},
+    {{"IDS_RPS_Error_Pushove_Hinge_Properties_DC_RATIO", kLit, nullptr, nullptr, "dcRatio.neg", kNeg}, [](const B& b) { return InUnit(b.fema->dcRatio->neg); }, HasRatio},
+};
+const R kStiffness[] = {
+    {{kHingeRuleMessage, kKey, "IDS_RPS_PO_PHGT_Initial_Stiffness", nullptr, "sides.pos.userStiffness", kPos, "", " >= 0"},
+     [](const B& b) { return NotAbove(0, b.pos.userStiffness); }, UserStiffness},
+    {{kHingeRuleMessage, kKey, "IDS_RPS_PO_PHGT_Initial_Stiffness", nullptr, "sides.neg.userStiffness", kNeg, "", " >= 0"},
+     [](const B& b) { return NotAbove(0, b.neg.userStiffness); }, [](const B& b) { return UserStiffness(b) && b.asymStiffness; }},
+};
+const R kUnloading[] = {
+    {{kHingeRuleMessage, kKey, "IDS_RPS_PO_PHGT_UNLOADING_EXP", nullptr, "unloadExponent"},   [](const B& b) { return NotAbove(0, b.fema->unloadExponent); }},
+    {{kHingeRuleMessage, kKey, "IDS_RPS_PO_PHGT_UNLOADING_PRF", nullptr, "unloadProportion"}, [](const B& b) { return InUnit(b.fema->unloadProportion); }},
+};
+const R kUnloadFactor[] = {
+    {{kHingeRuleMessage, kLit, "-1.0 <= Unloading Stiffness Factor <= 1.0", nullptr, "unloadFactor"},
+     [](const B& b) { return NotAbove(-1, b.fema->unloadFactor) && NotAbove(b.fema->unloadFactor, 1); }},
+};
+// clang-format on
+
+struct T_GROUP {
+    T_BACKBONE_RULES rules;
+    bool perForce;   // for each axial force
+    bool energyOnly; // only with the energy-based model
+};
+
+/// The groups in the order in which they are checked.
+std::array<T_GROUP, 10> Groups()
+{
+    return {{{PositiveSignRules(), true, false},
+             {NegativeSignRules(), true, false},
+             {FemaOrderRules(), true, false},
+             {AcceptanceRules(), true, false},
+             {kDcRatio, false, false},
+             {YieldStrengthRules(), true, false},
+             {kStiffness, true, false},
+             {kUnloading, false, false},
+             {CPO_HingeFEMAEnrgDsptGrid::Rules(), true, true},
+             {kUnloadFactor, false, true}}};
+}
+
+B BackboneOf(const T_SKEL_FEMA& f, const T_SIDES<T_SKEL_SIDE>& s)
+{
+    return {s.pos,           s.neg,           f.symmetric,
+            f.strengthLoss,  f.autoYield,     f.measure == SKEL_MEASURE::DDy,
+            f.initStiffness, f.asymStiffness, &f};
+}
+
+constexpr T_RULE_HEAD kCount{"IDS_RPS_MULTI_CURVE_COUNT", kLit, nullptr, nullptr, "curves"};
+
+/// The list of curves by axial force: at least two, no force twice.
+void ListFindings(const T_SKEL_FEMA& f, const T_PLACE& place, std::vector<T_FINDING>& out)
+{
+    if (f.curves.size() < 2) out.push_back(FindingOf(kCount, place));
+    for (std::size_t i = 0; i < f.curves.size(); ++i) {
+        const auto same = [&](const T_SKEL_AXIAL& a) { return a.axial == f.curves[i].axial; };
+        const auto end = f.curves.begin() + static_cast<std::ptrdiff_t>(i);
+        if (std::find_if(f.curves.begin(), end, same) == end) continue;
+        const std::string rule = FormatText("Axial Force %g already exists!", f.curves[i].axial);
+        T_RULE_HEAD head{kHingeRuleMessage, kLit, rule.c_str(), nullptr, "axial"};
+        out.push_back(FindingOf(head, {place.component, place.end, static_cast<int>(i)}));
+    }
+}
+
+/// Row conversion; the odd sources of positions 2 and 8 are meant.
+void ConvertRow(double (*f)(double, double), double thetaNeg, double thetaPos,
+                const std::array<double, 3>& middle, CPO_HingeSkcvTabFemaDlg::T_ROW& row)
+{
+    row[0] = -1.0 * f(row[0], thetaNeg);
+    row[1] = -1.0 * f(row[2], thetaNeg);
+    row[2] = -1.0 * f(row[2], thetaNeg);
+    std::copy(middle.begin(), middle.end(), row.begin() + 3);
+    row[6] = f(row[8], thetaPos);
+    row[7] = f(row[6], thetaPos);
+    row[8] = f(row[6], thetaPos);
+}
+
+void ConvertCurve(T_SKEL_FEMA& curve, SKEL_MEASURE to)
+{
+    ConvertSides(curve.sides, to);
+    for (T_SKEL_AXIAL& c : curve.curves)
+        ConvertSides(c.sides, to);
+    curve.measure = to;
+}
+
+std::size_t Index(HINGE_COMPONENT c)
+{
+    return static_cast<std::size_t>(c);
+}
+
+const T_SKEL_AXIAL* CurveOfForce(const T_SKEL_FEMA& f, double axial)
+{
+    for (const T_SKEL_AXIAL& c : f.curves)
+        if (c.axial == axial) return &c;
+    return nullptr;
+}
+
+void MirrorCurve(T_SKEL_CURVE& curve)
+{
+    T_SKEL_FEMA* f = std::get_if<T_SKEL_FEMA>(&curve);
+    if (!f || !f->symmetric) return;
+    MirrorSide(f->sides.pos, f->sides.neg);
+    for (T_SKEL_AXIAL& c : f->curves)
+        MirrorSide(c.sides.pos, c.sides.neg);
+}
+
+} // namespace
+
+int CPO_HingeSkcvTabFemaDlg::Data2Dlg(HINGE_COMPONENT c, const T_HINGE_COMPONENT& data)
+{
+    if (data.type != SKEL_TYPE::Fema || !std::holds_alternative<T_SKEL_FEMA>(data.curves.I) ||
+        !std::holds_alternative<T_SKEL_FEMA>(data.curves.J))
+        return 0;
+    m_components[Index(c)] = data;
+    m_switches[Index(c)] = {};
+    return 1;
+}
+
+int CPO_HingeSkcvTabFemaDlg::Dlg2Data(HINGE_COMPONENT c, T_HINGE_COMPONENT& data)
+{
+    if (!Component(c) || !CheckData()) return 0;
+    T_HINGE_COMPONENT result = *Component(c);
+    MirrorCurve(result.curves.I);
+    MirrorCurve(result.curves.J);
+    if (result.sameEnds) result.curves.J = result.curves.I;
+    data = std::move(result);
+    return 1;
+}
+
+T_HINGE_COMPONENT* CPO_HingeSkcvTabFemaDlg::Component(HINGE_COMPONENT c)
+{
+    return m_components[Index(c)] ? &*m_components[Index(c)] : nullptr;
+}
+
+T_SKEL_FEMA* CPO_HingeSkcvTabFemaDlg::Curve(HINGE_COMPONENT c, HINGE_END end)
+{
+    T_HINGE_COMPONENT* component = Component(c);
+    if (!component) return nullptr;
+    const bool j = end == HINGE_END::J && !component->sameEnds;
+    return std::get_if<T_SKEL_FEMA>(j ? &component->curves.J : &component->curves.I);
+}
+
+std::vector<T_FINDING> CPO_HingeSkcvTabFemaDlg::Findings() const
+{
+    std::vector<T_FINDING> out;
+    for (std::size_t i = 0; i < m_components.size(); ++i) {
+        if (!m_components[i] || !m_components[i]->active) continue;
+        ForEachPage(*m_components[i], [&](HINGE_END end, const T_SKEL_CURVE& curve) {
+            if (const T_SKEL_FEMA* f = std::get_if<T_SKEL_FEMA>(&curve))
+                CurveFindings(*f, {static_cast<int>(i), end}, out);
+        });
+    }
+    return out;
+}
+
+int CPO_HingeSkcvTabFemaDlg::CheckData()
+{
+    const std::vector<T_FINDING> found = Findings();
+    if (found.empty()) return 1;
+    ShowMessage(found.front().messageKey, found.front().text);
+    return 0;
+}
+
+void CPO_HingeSkcvTabFemaDlg::CurveFindings(const T_SKEL_FEMA& curve, T_PLACE place,
+                                            std::vector<T_FINDING>& out)
+{
+    if (curve.multiCurve) ListFindings(curve, place, out);
+    for (const T_GROUP& g : Groups()) {
+        if (g.energyOnly && !curve.energyBased) continue;
+        if (!g.perForce || !curve.multiCurve) {
+            WalkRules(g.rules, BackboneOf(curve, curve.sides), place, out);
+            continue;
+        }
+        for (std::size_t i = 0; i < curve.curves.size(); ++i)
+            WalkRules(g.rules, BackboneOf(curve, curve.curves[i].sides),
+                      {place.component, place.end, static_cast<int>(i)}, out);
+    }
+}
+
+double CPO_HingeSkcvTabFemaDlg::ConvertParamPR2DDy(double value, double thetaY)
+{
+    return PlasticFromRatio(value, thetaY);
+}
+
+double CPO_HingeSkcvTabFemaDlg::ConvertParamDDy2PR(double value, double thetaY)
+{
+    return RatioFromPlastic(value, thetaY);
+}
+
+void CPO_HingeSkcvTabFemaDlg::ConvertPR2DDy(double thetaNeg, double thetaPos, T_ROW& row)
+{
+    ConvertRow(ConvertParamPR2DDy, thetaNeg, thetaPos, {1.0, 0.0, 1.0}, row);
+}
+
+void CPO_HingeSkcvTabFemaDlg::ConvertDDy2PR(double thetaNeg, double thetaPos, T_ROW& row)
+{
+    ConvertRow(ConvertParamDDy2PR, thetaNeg, thetaPos, {0.0, 0.0, 0.0}, row);
+}
+
+int CPO_HingeSkcvTabFemaDlg::ConvertHingeParamPR2DDy(T_SKEL_FEMA& curve)
+{
+    if (curve.measure != SKEL_MEASURE::DDy) return 0;
+    ConvertCurve(curve, SKEL_MEASURE::Plastic);
+    return 1;
+}
+
+int CPO_HingeSkcvTabFemaDlg::ConvertHingeParamDDy2PR(T_SKEL_FEMA& curve)
+{
+    if (curve.measure != SKEL_MEASURE::Plastic) return 0;
+    ConvertCurve(curve, SKEL_MEASURE::DDy);
+    return 1;
+}
+
+int CPO_HingeSkcvTabFemaDlg::OnMeasureRdo(HINGE_COMPONENT c, HINGE_END end, SKEL_MEASURE measure)
+{
+    T_SKEL_FEMA* curve = Curve(c, end);
+    if (!curve) return 0;
+    if (curve->measure == measure) return 1;
+    const T_SKEL_FEMA was = *curve;
+    if (measure == SKEL_MEASURE::Plastic ? !ConvertHingeParamPR2DDy(*curve)
+                                         : !ConvertHingeParamDDy2PR(*curve))
+        return 0;
+    std::optional<T_SWITCH>& last = LastSwitch(c, end);
+    if (last && last->before.measure == measure) {
+        RestoreSides(curve->sides, was.sides, last->after.sides, last->before.sides);
+        for (T_SKEL_AXIAL& now : curve->curves) {
+            const T_SKEL_AXIAL* mid = CurveOfForce(was, now.axial);
+            const T_SKEL_AXIAL* after = CurveOfForce(last->after, now.axial);
+            const T_SKEL_AXIAL* before = CurveOfForce(last->before, now.axial);
+            if (mid && after && before)
+                RestoreSides(now.sides, mid->sides, after->sides, before->sides);
+        }
+    }
+    last = T_SWITCH{was, *curve};
+    return 1;
+}
+
+bool CPO_HingeSkcvTabFemaDlg::IsMomentRotationEnabled(HINGE_COMPONENT c) const
+{
+    if (!m_timeHistory) return c == HINGE_COMPONENT::My || c == HINGE_COMPONENT::Mz;
+    return c == HINGE_COMPONENT::Mx || c == HINGE_COMPONENT::My; // components 3 and 4, as they are
+}
+
+bool CPO_HingeSkcvTabFemaDlg::IsNeedIJTab(HINGE_COMPONENT c) const
+{
+    return m_components[Index(c)] && NeedsIJPages(*m_components[Index(c)]);
+}
+
+std::vector<const char*> CPO_HingeSkcvTabFemaDlg::PageTitles(HINGE_COMPONENT c) const
+{
+    std::vector<const char*> titles;
+    if (!m_components[Index(c)]) return titles;
+    ForEachPage(*m_components[Index(c)], [&](HINGE_END end, const T_SKEL_CURVE&) {
+        titles.push_back(PageTitleKey(*m_components[Index(c)], end));
+    });
+    return titles;
+}
+
+void CPO_HingeSkcvTabFemaDlg::SetAutoCalcValue(HINGE_COMPONENT c, HINGE_END end,
+                                               const T_SIDES<double>& yield)
+{
+    T_SKEL_FEMA* curve = Curve(c, end);
+    if (!curve || !curve->autoYield) return;
+    const auto set = [&](T_SIDES<T_SKEL_SIDE>& s) {
+        s.pos.yield = yield.pos;
+        s.neg.yield = yield.neg;
+    };
+    set(curve->sides);
+    for (T_SKEL_AXIAL& a : curve->curves)
+        set(a.sides);
+}
+
+void CPO_HingeSkcvTabFemaDlg::SetYieldDeform(HINGE_COMPONENT c, HINGE_END end,
+                                             const T_SIDES<double>& deform)
+{
+    T_SKEL_FEMA* curve = Curve(c, end);
+    if (!curve) return;
+    const auto set = [&](T_SIDES<T_SKEL_SIDE>& s) {
+        s.pos.yieldDeform = deform.pos;
+        s.neg.yieldDeform = deform.neg;
+    };
+    set(curve->sides);
+    for (T_SKEL_AXIAL& a : curve->curves)
+        set(a.sides);
+}
+
+bool CPO_HingeSkcvTabFemaDlg::IsInfillStrutMode(HINGE_COMPONENT c, HINGE_END end)
+{
+    const T_SKEL_FEMA* curve = Curve(c, end);
+    return curve && curve->infillStrut;
+}
+
+void CPO_HingeSkcvTabFemaDlg::SetInfillStrutMode(HINGE_COMPONENT c, HINGE_END end, bool on)
+{
+    if (T_SKEL_FEMA* curve = Curve(c, end)) curve->infillStrut = on;
+}
+
+std::array<const char*, 5> CPO_HingeSkcvTabFemaDlg::InfillLabels(bool general)
+{
+    if (general)
+        return {"IDS_RPS_PO_FEMA_INFILL_GENERAL_QQY", "IDS_RPS_PO_FEMA_INFILL_GENERAL_DELTAHM",
+                "IDS_RPS_PO_FEMA_INFILL_GENERAL_QY", "IDS_RPS_PO_FEMA_INFILL_GENERAL_DR",
+                "IDS_RPS_PO_FEMA_INFILL_GENERAL_SHOW_DEFORM"};
+    return {"IDS_RPS_PO_FEMA_INFILL_PLASTIC_FFY", "IDS_RPS_PO_FEMA_INFILL_PLASTIC_DDY",
+            "IDS_RPS_PO_FEMA_INFILL_PLASTIC_FY", "IDS_RPS_PO_FEMA_INFILL_PLASTIC_CD",
+            "IDS_RPS_PO_FEMA_INFILL_PLASTIC_DRIFT_RATIO"};
+}
+
+void CPO_HingeSkcvTabFemaDlg::OnMultiCurveChk(HINGE_COMPONENT c, HINGE_END end, bool on)
+{
+    if (T_SKEL_FEMA* curve = Curve(c, end)) curve->multiCurve = on;
+}
+
+int CPO_HingeSkcvTabFemaDlg::OnAxialForceBtn(HINGE_COMPONENT c, HINGE_END end)
+{
+    T_SKEL_FEMA* curve = Curve(c, end);
+    if (!curve) return 0;
+    CPO_HingeSkcvTabFemaAxialGrid grid;
+    grid.SetView(View());
+    grid.Data2Dlg(curve->curves);
+    if (!grid.DoModal()) return 0;
+    grid.Dlg2Data(curve->curves, curve->sides);
+    return 1;
+}
+
+T_SIDES<T_SKEL_SIDE>* CPO_HingeSkcvTabFemaDlg::SidesOf(HINGE_COMPONENT c, HINGE_END end,
+                                                       int axialIndex)
+{
+    T_SKEL_FEMA* curve = Curve(c, end);
+    if (!curve) return nullptr;
+    if (!curve->multiCurve) return &curve->sides;
+    const bool inside = axialIndex >= 0 && axialIndex < static_cast<int>(curve->curves.size());
+    return inside ? &curve->curves[static_cast<std::size_t>(axialIndex)].sides : nullptr;
+}
+
+std::optional<CPO_HingeSkcvTabFemaDlg::T_SWITCH>&
+CPO_HingeSkcvTabFemaDlg::LastSwitch(HINGE_COMPONENT c, HINGE_END end)
+{
+    const bool j = end == HINGE_END::J && !m_components[Index(c)]->sameEnds;
+    return m_switches[Index(c)][j ? 1 : 0];
+}

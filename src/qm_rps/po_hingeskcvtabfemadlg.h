@@ -1,0 +1,95 @@
+// Model of the editor of FEMA skeleton curves (ASCE 41 generalised force-deformation relation)
+// with their acceptance criteria.
+// Units: as the caller's; nothing here depends on them. Signs: the negative side holds negative
+// deformations, strengths and criteria; yield strengths and yield deformations are magnitudes.
+// State: a working copy of up to six components. A hinge type gives one, a time-history property
+// all that it has. Nothing leaves the editor before CheckData passes.
+#pragma once
+
+#include "qm_base/mdialog.h"
+#include "qm_rps/hingefindings.h"
+
+#include <array>
+#include <optional>
+#include <vector>
+
+class CPO_HingeSkcvTabFemaDlg : public zql::frx::MDialog {
+public:
+    using T_ROW = std::array<double, 9>; // -E, -D, -C, -B, A, B, C, D, E
+
+    /// Takes a component that has FEMA curves. 1 done; 0 it has other curves.
+    [[nodiscard]] int Data2Dlg(HINGE_COMPONENT c, const T_HINGE_COMPONENT& data);
+    /// Checks, then writes the component back, symmetric curves mirrored. 0: `data` as it was.
+    [[nodiscard]] int Dlg2Data(HINGE_COMPONENT c, T_HINGE_COMPONENT& data);
+
+    /// The component as edited, or null.
+    T_HINGE_COMPONENT* Component(HINGE_COMPONENT c);
+    /// The curve of a page (end I or Both: first page), or null. Views bind to it.
+    T_SKEL_FEMA* Curve(HINGE_COMPONENT c, HINGE_END end);
+
+    /// Every rule that is not kept; CheckData shows the first one.
+    std::vector<T_FINDING> Findings() const;
+    int CheckData() override;
+    /// The rules of one curve.
+    static void CurveFindings(const T_SKEL_FEMA& curve, T_PLACE place, std::vector<T_FINDING>& out);
+
+    /// Despite its name, D/Dy ratio to plastic deformation: (value - 1) * thetaY.
+    /// 0 where |thetaY| < 1e-7.
+    static double ConvertParamPR2DDy(double value, double thetaY);
+    /// Plastic deformation to D/Dy ratio: 1 + value / thetaY. 0 where |thetaY| < 1e-7.
+    static double ConvertParamDDy2PR(double value, double thetaY);
+
+    /// Row conversions of the table editor, in place. Positions 2 and 8 take their values from
+    /// positions 3 and 7, and every output reads the row as it stands then: this is meant. For a
+    /// true conversion of a curve use ConvertHingeParam....
+    static void ConvertPR2DDy(double thetaNeg, double thetaPos, T_ROW& row);
+    static void ConvertDDy2PR(double thetaNeg, double thetaPos, T_ROW& row);
+
+    /// Whole curve, all points, both signs, acceptance criteria, all axial forces: D/Dy ratios to
+    /// plastic deformations. 1 done; 0 the curve is not in D/Dy, nothing changed.
+    [[nodiscard]] static int ConvertHingeParamPR2DDy(T_SKEL_FEMA& curve);
+    /// Plastic deformations to D/Dy ratios. 0: the curve is not in plastic deformations.
+    [[nodiscard]] static int ConvertHingeParamDDy2PR(T_SKEL_FEMA& curve);
+
+    /// Switches the measure of a page. Values that were not edited since the last switch come back
+    /// digit by digit, even where a yield deformation of 0 has made them 0 meanwhile.
+    [[nodiscard]] int OnMeasureRdo(HINGE_COMPONENT c, HINGE_END end, SKEL_MEASURE measure);
+
+    /// Time-history mode (1): the moment-rotation options are open for components 3 and 4 alone.
+    void SetTimeHistory(int on) { m_timeHistory = on != 0; }
+    bool IsTimeHistory() const { return m_timeHistory; }
+    bool IsMomentRotationEnabled(HINGE_COMPONENT c) const;
+
+    /// Separate pages for I-end and J-end.
+    bool IsNeedIJTab(HINGE_COMPONENT c) const;
+    /// Keys of the page titles, one or two; none for a component that is not edited.
+    std::vector<const char*> PageTitles(HINGE_COMPONENT c) const;
+
+    /// Yield strengths from section and material: taken only while they are automatic.
+    void SetAutoCalcValue(HINGE_COMPONENT c, HINGE_END end, const T_SIDES<double>& yield);
+    /// Yield deformations of both sides, magnitudes.
+    void SetYieldDeform(HINGE_COMPONENT c, HINGE_END end, const T_SIDES<double>& deform);
+
+    /// Infill panel as a strut: the curve has its own labels.
+    bool IsInfillStrutMode(HINGE_COMPONENT c, HINGE_END end);
+    void SetInfillStrutMode(HINGE_COMPONENT c, HINGE_END end, bool on);
+    /// Keys of the labels of strengths, deformations, yield strength, criteria and drift ratio.
+    static std::array<const char*, 5> InfillLabels(bool general);
+
+    /// Curves by axial force on or off.
+    void OnMultiCurveChk(HINGE_COMPONENT c, HINGE_END end, bool on);
+    /// Runs the list of axial forces in the view and takes it when it was accepted.
+    [[nodiscard]] int OnAxialForceBtn(HINGE_COMPONENT c, HINGE_END end);
+    /// The sides of the chosen axial force (index), or of the curve itself; null: no such curve.
+    T_SIDES<T_SKEL_SIDE>* SidesOf(HINGE_COMPONENT c, HINGE_END end, int axialIndex);
+
+private:
+    struct T_SWITCH {
+        T_SKEL_FEMA before, after; // around the last switch of the measure
+    };
+    std::optional<T_SWITCH>& LastSwitch(HINGE_COMPONENT c, HINGE_END end);
+
+    std::array<std::optional<T_HINGE_COMPONENT>, 6> m_components;
+    std::array<std::array<std::optional<T_SWITCH>, 2>, 6> m_switches;
+    bool m_timeHistory = false;
+};

@@ -1,0 +1,45 @@
+// Model of the list of hinge types.
+#pragma once
+
+#include "qm_base/mdialog.h"
+#include "qm_db/hingerecords.h"
+#include "qm_db/records.h"
+
+#include <functional>
+
+/// How the list reaches the document.
+struct T_HINGE_LIST_ACCESS {
+    std::function<T_TABLE<T_PHGT_D>()> types;       // all hinge types by key
+    std::function<std::vector<int>(int key)> users; // ids of the elements with hinges of the type
+    std::function<int(int key)> erase;              // 1 deleted
+};
+
+class CPO_HingeTypeListDlg : public zql::frx::MDialog {
+public:
+    struct T_ROW {
+        int key = 0;
+        std::string name;    // "1 : column", key and name
+        std::string element; // text of the element type
+        bool operator==(const T_ROW&) const = default;
+    };
+    static constexpr std::array<const char*, 2> kHeads{"IDS_RPS_PO_Hinge_Name",
+                                                       "IDS_RPS_PO_Element_Type"};
+
+    explicit CPO_HingeTypeListDlg(T_HINGE_LIST_ACCESS access);
+
+    std::vector<T_ROW> Rows() const;
+    /// Text of an element type; a value outside the five is shown as an error, not refused.
+    static std::string DataToStr(HINGE_ELEMENT element);
+    /// "%d : %s"
+    static std::string NameOf(int key, const std::string& name);
+
+    /// Key of the chosen type; 0: none.
+    int m_selected = 0;
+    /// The chosen type exists. 0 with a message otherwise.
+    int CheckData() override;
+    /// Deletes the chosen type. 0 with a message: none chosen, gone, or used (naming elements).
+    [[nodiscard]] int OnDelete();
+
+private:
+    T_HINGE_LIST_ACCESS m_access;
+};

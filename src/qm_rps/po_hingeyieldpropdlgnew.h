@@ -1,0 +1,44 @@
+// Model of the editor of a hinge type's yield surface.
+#pragma once
+
+#include "qm_base/mdialog.h"
+#include "qm_db/hingerecords.h"
+#include "qm_rps/hingefindings.h"
+
+class CPO_HingeYieldPropDlgNew : public zql::frx::MDialog {
+public:
+    /// The normaliser of the moments of an Eurocode surface, as shown.
+    static constexpr const char* kMomentNormaliserText =
+        " Mmax = max ( |MUy(+)|, |MUy(-)|, |MUz(+)|, |MUz(-)| )";
+
+    /// Edits a copy; OnOK writes it back to `record`, which is not owned. The skeleton curve fixes
+    /// the levels: trilinear (and slip trilinear) crack and yield, which is checked as entered, so
+    /// a missing crack level counts as zeros; Eurocode one level with its own labels; else the
+    /// yield level alone.
+    CPO_HingeYieldPropDlgNew(T_YIELD_SURFACE& record, SKEL_TYPE type)
+        : m_surface(record), m_type(type), m_record(record)
+    {
+    }
+
+    T_YIELD_SURFACE m_surface; // as edited
+    bool m_showValue = false;  // IDS_RPS_Show_Value against IDS_RPS_Show_Ratio
+
+    /// All rules that are not kept. First every strength and moment > 0 (crack level, yield level;
+    /// the axial strengths belong to both axes and are always checked), then for each point
+    /// -1 < M/MY,max < 1 of (+) and (-), then along each curve P/Pmax falling on the tension side
+    /// and on the compression side. An axis that is not used is not checked. A NaN fails its rule.
+    std::vector<T_FINDING> Findings() const;
+    /// Shows the first finding under IDS_CMD_IEHP_YIELD.
+    int CheckData() override;
+    /// 1 and the record holds the surface; 0 and the record is unchanged.
+    int OnOK() override;
+
+    /// Key of the note in place of an axis that is not used; empty where it is used.
+    std::string AxisNoteKey(bool aboutY) const;
+    /// Largest of the four largest moments of a level.
+    static double MomentNormaliser(const T_YIELD_LEVEL& level);
+
+private:
+    SKEL_TYPE m_type;
+    T_YIELD_SURFACE& m_record;
+};

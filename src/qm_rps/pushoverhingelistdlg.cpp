@@ -1,0 +1,60 @@
+#include "qm_rps/pushoverhingelistdlg.h"
+
+#include "qm_base/appbase.h"
+#include "qm_base/msgfunction.h"
+
+using zql::lib::MMSGFunction;
+
+std::string CPushOverHingeListDlg::InteractionText(int code)
+{
+    switch (code) {
+    case 0:
+        return "P";
+    case 1:
+        return "My-Mz";
+    case 2:
+        return "Vy-Vz";
+    case 3:
+        return "PMM";
+    case 4:
+        return MMSGFunction::GetValue("IDS_RPS_PUSHOVER_User");
+    default:
+        break;
+    }
+    if (CAppBase::IsReleaseAssert_ST())
+        CAppBase::ReleaseAssertion_ST("src/qm_rps/pushoverhingelistdlg", __LINE__);
+    return {};
+}
+
+std::string CPushOverHingeListDlg::FamilyText(int code)
+{
+    if (code == 0) return MMSGFunction::GetValue("IDS_RPS_MULTILINEAR");
+    return code == 1 ? "FEMA" : MMSGFunction::GetValue("IDS_PUSHOVER_Error");
+}
+
+std::string CPushOverHingeListDlg::ColumnHead(HINGE_COMPONENT c, bool positive)
+{
+    return std::string(kComponentNames[static_cast<std::size_t>(c)]) + (positive ? "(+)" : "(-)");
+}
+
+std::string CPushOverHingeListDlg::StrengthText(HINGE_COMPONENT c, bool crack)
+{
+    const bool moment = c >= HINGE_COMPONENT::Mx;
+    if (crack)
+        return MMSGFunction::GetValue(moment ? "IDS_RPS_PUSHOVER_CRACK_MOMENT"
+                                             : "IDS_RPS_PUSHOVER_CRACK_FROCE");
+    return MMSGFunction::GetValue(moment ? "IDS_RPS_PUSHOVER_YIELD_MOMENT"
+                                         : "IDS_RPS_PUSHOVER_YIELD_FROCE");
+}
+
+int CPushOverHingeListDlg::CheckData()
+{
+    if (m_selected == 0) {
+        ShowMessage("IDS_PUSHOVER_No_selected_Hinge_Data__nChoose_one_an");
+        return 0;
+    }
+    if (m_hinges && m_hinges().count(m_selected)) return 1;
+    constexpr const char* gone = "IDS_PUSHOVER_Generated_Hinge_key__d_does_not_exits_";
+    ShowMessage(gone, MMSGFunction::Format(gone, {std::to_string(m_selected)}));
+    return 0;
+}

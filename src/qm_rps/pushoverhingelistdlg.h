@@ -1,0 +1,26 @@
+// Model of the list of hinges generated for elements, with the texts of the hinge type's codes.
+#pragma once
+
+#include "qm_base/mdialog.h"
+#include "qm_db/hingerecords.h"
+#include "qm_db/records.h"
+
+#include <functional>
+
+class CPushOverHingeListDlg : public zql::frx::MDialog {
+public:
+    /// Text of the interaction kind 0 to 4; another code is an assertion failure and an empty text.
+    static std::string InteractionText(int code);
+    /// Text of the curve family: 0 multilinear, 1 FEMA; any other is shown as an error.
+    static std::string FamilyText(int code);
+    /// Head of the column of a component's strength: "Fx(+)", "Mz(-)".
+    static std::string ColumnHead(HINGE_COMPONENT c, bool positive);
+    /// Text of the strength's kind: crack or yield, force or moment.
+    static std::string StrengthText(HINGE_COMPONENT c, bool crack);
+
+    std::function<T_TABLE<T_PHGE_D>()> m_hinges; // all generated hinges by key
+    int m_selected = 0;                          // key of the chosen hinge; 0: none
+
+    /// The chosen hinge exists. 0 with a message otherwise.
+    int CheckData() override;
+};

@@ -1,0 +1,25 @@
+// Model of the dialog of user-defined P-M interaction curves.
+#pragma once
+
+#include "qm_base/mdialog.h"
+#include "qm_db/hingerecords.h"
+#include "qm_rps/hingefindings.h"
+
+class CPushOverPMMInteractionDlg : public zql::frx::MDialog {
+public:
+    /// Edits a copy; OnOK writes the whole table back to `record`, which is not owned.
+    explicit CPushOverPMMInteractionDlg(T_PMM_TABLE& record) : m_table(record), m_record(record) {}
+
+    T_PMM_TABLE m_table; // as edited; ratios, Pmax a force
+
+    /// Along each curve neither P nor M rises (equal values pass), then Pmax >= 0; a number that is
+    /// not finite fails its rule.
+    std::vector<T_FINDING> Findings() const;
+    /// Shows the first finding: IDS_PUSHOVER_Wrong_Data_in_P_values or IDS_PUSHOVER_PMAX_POS.
+    int CheckData() override;
+    /// 1 and the record holds the table; 0 and the record is unchanged.
+    int OnOK() override;
+
+private:
+    T_PMM_TABLE& m_record;
+};

@@ -1,0 +1,39 @@
+// Properties of rectangle, circle, pipe, box and I from their dimensions (sharp corners).
+#pragma once
+
+#include "qm_db/hingerecords.h"
+
+#include <vector>
+
+enum class SECT_FAULT {
+    None,
+    Dimensions,   // a dimension is not above 0 or not finite, or the walls leave no hollow
+    Values,       // an entered property is negative or not finite
+    Material,     // a strength or modulus is not above 0 or not finite
+    Class,        // no method for this material class
+    Shape,        // no method for this shape in this material
+    NoBars,       // concrete without bars
+    Bars,         // a bar outside the concrete, without area, or more steel than section
+    NotConverged, // the neutral axis was not found within the iteration limit
+};
+/// Message key of a fault; empty for None.
+const char* MessageKeyOf(SECT_FAULT fault);
+
+/// A part of a section that is symmetric about both axes, centred on the centroid.
+struct T_SECT_PIECE {
+    double sign = 1.0;               // -1: cut out
+    bool round = false;              // a circle of diameter `depth`, else a rectangle
+    double width = 0.0, depth = 0.0; // along and across the bending axis
+};
+
+class CSectionProperties {
+public:
+    /// Fills area, shear areas, torsion constant, second moments and plastic moduli of a copy of
+    /// the section; a section given by values keeps them. 1 done; 0 with the fault (Dimensions,
+    /// Values), `out` unchanged. `in` and `out` may be the same record.
+    [[nodiscard]] static int Calc(const T_SECT_D& in, T_SECT_D& out, SECT_FAULT& fault);
+
+    /// The section as a sum of pieces for bending about y (depth along z) or about z. Empty for a
+    /// section given by values. The dimensions must be sound.
+    static std::vector<T_SECT_PIECE> Pieces(const T_SECT_D& section, bool aboutY);
+};

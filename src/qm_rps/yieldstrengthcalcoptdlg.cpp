@@ -1,0 +1,45 @@
+#include "qm_rps/yieldstrengthcalcoptdlg.h"
+
+#include <algorithm>
+
+namespace {
+
+struct T_CODE_PAIR {
+    const char *concrete, *steel;
+    YIELD_CODE code;
+};
+constexpr T_CODE_PAIR kPairs[] = {
+    {"Eurocode2", "Eurocode3", YIELD_CODE::Eurocode},
+    {"Eurocode2", "Eurocode3:05", YIELD_CODE::Eurocode},
+    {"Eurocode2:04", "Eurocode3", YIELD_CODE::Eurocode},
+    {"Eurocode2:04", "Eurocode3:05", YIELD_CODE::Eurocode},
+    {"AIJ-WSD99", "AIJ-ASD02", YIELD_CODE::Aij},
+};
+
+} // namespace
+
+YIELD_CODE CYieldStrengthCalcOptDlg::CodeOf(std::string_view concreteCode,
+                                            std::string_view steelCode)
+{
+    for (const T_CODE_PAIR& p : kPairs)
+        if (concreteCode == p.concrete && steelCode == p.steel) return p.code;
+    return YIELD_CODE::General;
+}
+
+int CYieldStrengthCalcOptDlg::OnSelectElemChk(bool on,
+                                              const std::vector<T_SELECTED_ELEM>& selection)
+{
+    T_YIELD_CALC_OPT data;
+    data.selectedOnly = on;
+    for (const T_SELECTED_ELEM& e : selection) {
+        if (!on) break;
+        if (e.element != m_element) {
+            ShowMessage("IDS_CMD2_SOD_SEL_ELEM_WRONG_ELEM");
+            return 0;
+        }
+        data.elements.push_back(e.id);
+    }
+    std::sort(data.elements.begin(), data.elements.end());
+    m_data = data;
+    return 1;
+}

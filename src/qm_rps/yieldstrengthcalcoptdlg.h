@@ -1,0 +1,49 @@
+// Model of the dialog of the options of the yield strength calculation.
+#pragma once
+
+#include "qm_base/mdialog.h"
+#include "qm_db/hingerecords.h"
+
+#include <string_view>
+
+enum class YIELD_CODE { General, Eurocode, Aij };
+
+struct T_YIELD_CALC_OPT {
+    bool selectedOnly = false; // calculate for the selected elements alone
+    std::vector<int> elements; // their ids, ascending
+    bool operator==(const T_YIELD_CALC_OPT&) const = default;
+};
+
+struct T_SELECTED_ELEM {
+    int id = 0;
+    HINGE_ELEMENT element = HINGE_ELEMENT::BeamColumn;
+};
+
+class CYieldStrengthCalcOptDlg : public zql::frx::MDialog {
+public:
+    /// `element`: the kind of element that the calculation is for.
+    explicit CYieldStrengthCalcOptDlg(HINGE_ELEMENT element = HINGE_ELEMENT::BeamColumn)
+        : m_element(element)
+    {
+    }
+
+    /// Eurocode: concrete "Eurocode2" or "Eurocode2:04" with steel "Eurocode3" or "Eurocode3:05".
+    /// AIJ: "AIJ-WSD99" with "AIJ-ASD02". Any other pair: general. Exact spelling.
+    static YIELD_CODE CodeOf(std::string_view concreteCode, std::string_view steelCode);
+
+    static constexpr const char* kTitleKey = "IDS_DB_DT_YSCO";
+
+    void SetData(const T_YIELD_CALC_OPT& data) { m_data = data; }
+    void GetData(T_YIELD_CALC_OPT& data) const { data = m_data; }
+
+    /// Restricts the calculation to the selection, or takes the restriction off. 0 shows
+    /// IDS_CMD2_SOD_SEL_ELEM_WRONG_ELEM for an element of another kind; the options stay.
+    int OnSelectElemChk(bool on, const std::vector<T_SELECTED_ELEM>& selection);
+    /// Show how material strengths and section properties enter the calculation.
+    void OnMatlDescBtn() { ShowMessage("IDS_QM_YSCO_MATERIAL"); }
+    void OnEffeDescBtn() { ShowMessage("IDS_QM_YSCO_SECTION"); }
+
+private:
+    HINGE_ELEMENT m_element;
+    T_YIELD_CALC_OPT m_data;
+};

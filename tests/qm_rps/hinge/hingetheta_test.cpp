@@ -1,0 +1,112 @@
+#include "qm_rps/hingetheta.h"
+
+#include <gtest/gtest.h>
+#include <limits>
+
+namespace {
+
+using C = HINGE_COMPONENT;
+using L = HINGE_LOCATION;
+using S = INIT_STIFFNESS;
+
+// N, mm. G = 260000 / 2.6 = 100000.
+T_SECT_D Section()
+{
+    T_SECT_D s;
+    s.Iyy = 1e8;
+    s.Izz = 4e7;
+    s.Asy = 2000;
+    s.Asz = 5000;
+    s.factorsI = {1, 0.5, 0.2, 1, 0.5, 1.0}; // area, Asy, Asz, J, Iyy, Izz
+    s.factorsJ = {1, 0.25, 0.4, 1, 0.25, 0.8};
+    return s;
+}
+T_MATL_D Material()
+{
+    T_MATL_D m;
+    m.E = 260000;
+    m.nu = 0.3;
+    return m;
+}
+
+} // namespace
+
+TEST(HingeTheta, FollowsComponentEndAndOption)
+{
+    const T_SECT_D section = Section();
+    const T_MATL_D material = Material();
+    const T_THETA_LOOKUP lookup{&section, &material, 4000};
+    struct T_CASE {
+        const char* label;
+        bool moment;
+        C component;
+        L end;
+        S option;
+        double strength, expected;
+    };
+    // EI/L of My at I: 260000 * 1e8 * 0.5 / 4000 = 3.25e9; at J 1.625e9; of Mz 2.6e9 and 2.08e9.
+    const T_CASE cases[] = {
+        {"My I 6EI/L", true, C::My, L::IEnd, S::EI6L, 3.9e8, 3.9e8 / 1.95e10},
+        {"My I 3EI/L", true, C::My, L::IEnd, S::EI3L, 3.9e8, 0.04},
+        {"My I 2EI/L", true, C::My, L::IEnd, S::EI2L, 3.9e8, 0.06},
+        {"My J 6EI/L", true, C::My, L::JEnd, S::EI6L, 3.9e8, 0.04},
+        {"Mz I 6EI/L", true, C::Mz, L::IEnd, S::EI6L, 1.56e8, 0.01},
+        {"Mz J 6EI/L", true, C::Mz, L::JEnd, S::EI6L, 1.56e8, 0.0125},
+        {"My user", true, C::My, L::IEnd, S::User, 3.9e8, 0.0039},
+        {"negative", true, C::My, L::IEnd, S::EI6L, -3.9e8, -0.02},
+        {"Fy I", false, C::Fy, L::IEnd, S::Elastic, 1e5, 1e-3}, // K = 1e5 * 1000
+        {"Fy J", false, C::Fy, L::JEnd, S::Elastic, 1e5, 2e-3}, // 1e5 * 500
+        {"Fz I", false, C::Fz, L::IEnd, S::Elastic, 2e5, 2e-3}, // 1e5 * 1000
+        {"Fz J", false, C::Fz, L::JEnd, S::Elastic, 2e5, 1e-3}, // 1e5 * 2000
+        {"Fz user", false, C::Fz, L::JEnd, S::User, 2e5, 2e-6}, // 1e11
+        {"moment of Fy", true, C::Fy, L::IEnd, S::EI6L, 1e8, 0},
+        {"moment of Mx", true, C::Mx, L::IEnd, S::User, 1e8, 0},
+        {"moment elastic", true, C::My, L::IEnd, S::Elastic, 1e8, 0},
+        {"moment at centre", true, C::My, L::Center, S::EI6L, 1e8, 0},
+        {"moment at both", true, C::My, L::BothEnds, S::EI6L, 1e8, 0},
+        {"shear of My", false, C::My, L::IEnd, S::Elastic, 1e5, 0},
+        {"shear of Fx", false, C::Fx, L::IEnd, S::User, 1e5, 0},
+        {"shear 6EI/L", false, C::Fy, L::IEnd, S::EI6L, 1e5, 0},
+        {"shear 2EI/L", false, C::Fy, L::IEnd, S::EI2L, 1e5, 0},
+    };
+    for (const T_CASE& c : cases) {
+        const double r = c.moment ? CHingeTheta::CalcThetaMoment(lookup, c.component, c.end,
+                                                                 c.option, 1e11, c.strength)
+                                  : CHingeTheta::CalcThetaShear(lookup, c.component, c.end,
+                                                                c.option, 1e11, c.strength);
+        EXPECT_NEAR(c.expected, r, 1e-12) << c.label;
+    }
+}
+
+TEST(HingeTheta, IsZeroWithoutBasisOrStiffness)
+{
+    const T_SECT_D section = Section();
+    const T_MATL_D material = Material();
+    const auto moment = [&](const T_SECT_D* s, const T_MATL_D* m, double length, double user) {
+        const S option = user != 0.0 ? S::User : S::EI6L;
+        return CHingeTheta::CalcThetaMoment({s, m, length}, C::My, L::IEnd, option, user, 1.0);
+    };
+    EXPECT_EQ(0.0, moment(nullptr, &material, 1, 5));
+    EXPECT_EQ(0.0, moment(&section, nullptr, 1, 5));
+    EXPECT_EQ(0.0, moment(&section, &material, 0, 0)) << "no length";
+    EXPECT_EQ(0.0, moment(&section, &material, 1, -5)) << "negative stiffness";
+    EXPECT_EQ(0.0, moment(&section, &material, 1, 0.9e-10));
+    EXPECT_DOUBLE_EQ(1 / 1.1e-10, moment(&section, &material, 1, 1.1e-10));
+    EXPECT_EQ(0.0, moment(&section, &material, std::numeric_limits<double>::quiet_NaN(), 0));
+}
+
+TEST(HingeTheta, TakesTheInertiaOfAShapeFromItsDimensions)
+{
+    T_SECT_D s;
+    s.shape = SECT_SHAPE::Rectangle;
+    s.size = {500, 300};
+    s.Iyy = 1.0; // entered values of a shape do not count
+    const T_MATL_D material = Material();
+    // 6 * 260000 * 3.125e9 / 4875 = 1e12
+    EXPECT_NEAR(
+        1e-3, CHingeTheta::CalcThetaMoment({&s, &material, 4875}, C::My, L::IEnd, S::EI6L, 0, 1e9),
+        1e-12);
+    s.size = {500, -300};
+    EXPECT_EQ(0.0,
+              CHingeTheta::CalcThetaMoment({&s, &material, 4875}, C::My, L::IEnd, S::EI6L, 0, 1e9));
+}

@@ -1,0 +1,343 @@
+#include "qm_rps/sectionstrength.h"
+
+#include <cmath>
+#include <gtest/gtest.h>
+#include <limits>
+#include <numbers>
+
+namespace {
+
+using std::numbers::pi;
+constexpr double kNan = std::numeric_limits<double>::quiet_NaN();
+
+T_SECT_D Shape(SECT_SHAPE shape, std::array<double, 4> size)
+{
+    T_SECT_D s;
+    s.shape = shape;
+    s.size = size;
+    return s;
+}
+T_MATL_D Steel(double fy)
+{
+    T_MATL_D m;
+    m.Fy = fy;
+    return m;
+}
+T_MATL_D Concrete(double fck, double fyk)
+{
+    T_MATL_D m;
+    m.type = MATL_CLASS::Concrete;
+    m.fck = fck;
+    m.fyk = fyk;
+    m.Es = 200000;
+    return m;
+}
+T_SECT_D Column(double h, double b, double z, double y, double bar)
+{
+    T_SECT_D s = Shape(SECT_SHAPE::Rectangle, {h, b});
+    s.bars = {{y, z, bar}, {-y, z, bar}, {y, -z, bar}, {-y, -z, bar}};
+    return s;
+}
+const T_SECT_D kI = Shape(SECT_SHAPE::IShape, {300, 150, 7.1, 10.7});
+
+double MomentAt(const T_SECT_D& s, const T_MATL_D& m, bool aboutY, double axial, bool pos = true)
+{
+    double moment = -1.0;
+    SECT_FAULT fault;
+    EXPECT_EQ(1, CSectionStrength::CalcMoment(s, m, aboutY, pos, axial, moment, fault)) << axial;
+    return moment;
+}
+T_SECTION_STRENGTH Strength(const T_SECT_D& s, const T_MATL_D& m)
+{
+    T_SECTION_STRENGTH r;
+    SECT_FAULT fault;
+    EXPECT_EQ(1, CSectionStrength::Calc(s, m, r, fault)) << MessageKeyOf(fault);
+    return r;
+}
+
+} // namespace
+
+TEST(SectionProperties, AreTheHandValuesOfEachShape)
+{
+    struct T_CASE {
+        const char* label;
+        T_SECT_D section;
+        double A, Asy, Asz, J, Iyy, Izz, Zy, Zz;
+    };
+    // Rectangle torsion: 0.1406 a4 and 0.229 * 2 b4 (Timoshenko and Goodier, section 109, table).
+    // Box: J = 2 (290 * 192)^2 / (290 / 8 + 192 / 10).
+    const T_CASE cases[] = {
+        {"square", Shape(SECT_SHAPE::Rectangle, {100, 100}), 1e4, 8333.333, 8333.333, 0.1406e8,
+         8333333.3, 8333333.3, 250000, 250000},
+        {"rectangle", Shape(SECT_SHAPE::Rectangle, {200, 100}), 2e4, 16666.667, 16666.667, 0.458e8,
+         66666667, 16666667, 1e6, 5e5},
+        {"flat rectangle", Shape(SECT_SHAPE::Rectangle, {100, 200}), 2e4, 16666.667, 16666.667,
+         0.458e8, 16666667, 66666667, 5e5, 1e6},
+        {"circle", Shape(SECT_SHAPE::Circle, {200}), 31415.927, 28274.334, 28274.334, 157079633,
+         78539816, 78539816, 1333333.3, 1333333.3},
+        {"pipe", Shape(SECT_SHAPE::Pipe, {200, 10}), 5969.026, 2984.513, 2984.513, 54019686,
+         27009843, 27009843, 361333.33, 361333.33},
+        {"box", Shape(SECT_SHAPE::Box, {300, 200, 8, 10}), 8480, 4000, 4800, 111821908, 113402666.7,
+         54644906.7, 893600, 630080},
+        {"I", kI, 5188.06, 2675, 2130, 155742.3, 79989869.5, 6027059.5, 602098.38, 123886.06},
+    };
+    for (const T_CASE& c : cases) {
+        T_SECT_D r;
+        SECT_FAULT fault;
+        ASSERT_EQ(1, CSectionProperties::Calc(c.section, r, fault)) << c.label;
+        const double got[] = {r.area, r.Asy, r.Asz, r.Iyy, r.Izz, r.Zy, r.Zz};
+        const double want[] = {c.A, c.Asy, c.Asz, c.Iyy, c.Izz, c.Zy, c.Zz};
+        for (int i = 0; i < 7; ++i)
+            EXPECT_NEAR(want[i], got[i], 1e-6 * want[i]) << c.label << ' ' << i;
+        EXPECT_NEAR(c.J, r.J, 2e-3 * c.J) << c.label; // the table prints three or four digits
+    }
+}
+
+TEST(SectionProperties, KeepEnteredValuesAndRefuseImpossibleDimensions)
+{
+    T_SECT_D value;
+    value.area = 7;
+    value.J = 5;
+    value.Zz = 3;
+    value.name = "by values";
+    T_SECT_D out;
+    SECT_FAULT fault;
+    EXPECT_EQ(1, CSectionProperties::Calc(value, out, fault));
+    EXPECT_EQ(value, out);
+    value.Iyy = -1;
+    EXPECT_EQ(0, CSectionProperties::Calc(value, out, fault));
+    EXPECT_EQ(SECT_FAULT::Values, fault);
+    const T_SECT_D bad[] = {
+        Shape(SECT_SHAPE::Rectangle, {0, 10}),
+        Shape(SECT_SHAPE::Rectangle, {10, kNan}),
+        Shape(SECT_SHAPE::Circle, {-1}),
+        Shape(SECT_SHAPE::Pipe, {20, 10}),
+        Shape(SECT_SHAPE::Box, {30, 20, 10, 1}),
+        Shape(SECT_SHAPE::Box, {30, 20, 1, 15}),
+        Shape(SECT_SHAPE::IShape, {30, 20, 21, 1}),
+        Shape(SECT_SHAPE::IShape, {30, 20, 1, 15}),
+    };
+    const T_SECT_D before = out;
+    for (const T_SECT_D& s : bad) {
+        EXPECT_EQ(0, CSectionProperties::Calc(s, out, fault)) << s.size[0] << ' ' << s.size[1];
+        EXPECT_EQ(SECT_FAULT::Dimensions, fault);
+        EXPECT_EQ(before, out);
+    }
+}
+
+TEST(SectionStrength, SteelFollowsThePlasticNeutralAxis)
+{
+    const T_MATL_D m = Steel(235);
+    // Web, a = 50: N = fy tw 2a, M = fy (Zy - tw a2). Flange, a = 145: within the web 1978.06 and
+    // 2 * 150 * 5.7 of the flanges; M = fy b (150^2 - 145^2).
+    EXPECT_NEAR(235 * 602098.38, MomentAt(kI, m, true, 0), 300);
+    EXPECT_NEAR(235 * (602098.38 - 7.1 * 2500), MomentAt(kI, m, true, 235 * 710.0), 300);
+    EXPECT_NEAR(235 * 221250.0, MomentAt(kI, m, true, 235 * 3688.06), 300);
+    EXPECT_NEAR(235 * 221250.0, MomentAt(kI, m, true, -235 * 3688.06, false), 300);
+    // Weak axis, a = 2 inside the web thickness: the full height of 300 yields axially; a = 50:
+    // 278.6 * 7.1 of the web and 2 * 10.7 * 100, M = fy 2 tf (75^2 - 50^2).
+    EXPECT_NEAR(235 * (123886.06 - 300 * 4.0), MomentAt(kI, m, false, 235 * 1200.0), 100);
+    EXPECT_NEAR(235 * 21.4 * 3125, MomentAt(kI, m, false, 235 * (1978.06 + 2140)), 100);
+    // Circle, a = R/2: N = 2 fy R2 (0.5 cos30 + pi/6), M = 4/3 fy (R cos30)^3.
+    const T_SECT_D circle = Shape(SECT_SHAPE::Circle, {200});
+    const double c30 = std::sqrt(0.75);
+    EXPECT_NEAR(4.0 / 3 * 235 * 1e6 * c30 * c30 * c30,
+                MomentAt(circle, m, true, 2 * 235 * 1e4 * (0.5 * c30 + pi / 6)), 500);
+    // Thin pipe: M / Mp = cos(pi n / 2), error of order (t/D)^2. Box, a = 50: two webs.
+    const T_SECT_D pipe = Shape(SECT_SHAPE::Pipe, {200, 2});
+    const double area = pi * 198 * 2, Z = (8e6 - 196.0 * 196 * 196) / 6;
+    EXPECT_NEAR(std::sqrt(0.5), MomentAt(pipe, m, false, 235 * area / 2) / (235 * Z), 5e-4);
+    const T_SECT_D box = Shape(SECT_SHAPE::Box, {300, 200, 8, 10});
+    EXPECT_NEAR(235 * (893600 - 16 * 2500.0), MomentAt(box, m, true, 235 * 1600.0), 300);
+    EXPECT_NEAR(235 * (630080 - 20 * 2500.0), MomentAt(box, m, false, 235 * 2000.0), 300);
+}
+
+TEST(SectionStrength, SteelGivesEveryStrengthAndTheTenPoints)
+{
+    const T_SECTION_STRENGTH r = Strength(kI, Steel(235));
+    EXPECT_NEAR(235 * 5188.06, r.yield[0]->pos, 1);
+    EXPECT_NEAR(235 * 2675 / std::sqrt(3.0), r.yield[1]->pos, 1);
+    EXPECT_NEAR(235 * 2130 / std::sqrt(3.0), r.yield[2]->neg, 1);
+    EXPECT_FALSE(r.yield[3]);
+    EXPECT_NEAR(235 * 602098.38, r.yield[4]->neg, 300);
+    EXPECT_NEAR(235 * 123886.06, r.yield[5]->pos, 100);
+    // A solid rectangle: M / Mp = 1 - n2. By values: the straight line 1 - n.
+    T_SECT_D value;
+    value.area = 100;
+    value.Zy = value.Zz = 50;
+    const T_SECTION_STRENGTH rect = Strength(Shape(SECT_SHAPE::Rectangle, {20, 10}), Steel(300));
+    const T_SECTION_STRENGTH line = Strength(value, Steel(300));
+    const double n[] = {1, 0.75, 0.5, 0.25, 0.05, -0.05, -0.25, -0.5, -0.75, -1};
+    for (std::size_t i = 0; i < 10; ++i) {
+        EXPECT_NEAR(n[i], rect.level.z.curves.neg[i].p, 1e-8) << i;
+        EXPECT_NEAR(1 - n[i] * n[i], rect.level.y.curves.pos[i].m, 1e-8) << i;
+        EXPECT_NEAR(1 - n[i] * n[i], rect.level.z.curves.neg[i].m, 1e-8) << i;
+        EXPECT_NEAR(1 - std::fabs(n[i]), line.level.y.curves.pos[i].m, 1e-8) << i;
+    }
+}
+
+// Parabola-rectangle block with the neutral axis at x inside the section: force 17/21 fck b x at
+// 99/238 x under the edge (0.8095 and 0.4160); bars less the concrete that they displace.
+TEST(SectionStrength, ConcreteColumnsFollowTheClosedFormDiagram)
+{
+    struct T_CASE {
+        const char* label;
+        T_SECT_D section;
+        T_MATL_D material;
+        double pure, tension;  // N
+        double nBal, mBal, m0; // N, N mm
+    };
+    // 400 x 400, d' = 50, 2 x 1250 mm2, C30, 500: pure 30 * 160000 + 2500 (400 - 30). Balanced:
+    // x = 350 * 3.5 / 6 = 204.17; C = 1983333, arm 115.07; bars 1250 (500 - 30) and 1250 * 500 at
+    // 150. Bending: x = 56.00, C = 544000, upper bars at 75 - 10.2 MPa.
+    // 300 x 500, d' = 50, 2 x 1500 mm2, C25, 400: pure 25 * 150000 + 3000 (400 - 25). Balanced:
+    // x = 450 * 3.5 / 5.5 = 286.36; C = 1738636, arm 130.88; bars 562500 and 600000 at 200.
+    // Bending: x = 64.278, C = 390257, upper bars 209743.
+    const T_CASE cases[] = {
+        {"400 x 400", Column(400, 400, 150, 150, 625), Concrete(30, 500), 5725000, 1250000,
+         1945833.3, 410104166, 202.03e6},
+        {"300 x 500", Column(500, 300, 200, 100, 750), Concrete(25, 400), 4875000, 1200000,
+         1701136.4, 460056818, 249.078e6},
+    };
+    for (const T_CASE& c : cases) {
+        const T_SECTION_STRENGTH r = Strength(c.section, c.material);
+        EXPECT_NEAR(c.pure, r.level.compression, 1e-8 * c.pure) << c.label;
+        EXPECT_NEAR(c.tension, r.level.tension, 1e-8 * c.tension) << c.label;
+        EXPECT_NEAR(c.pure, r.yield[0]->neg, 1e-8 * c.pure) << c.label;
+        EXPECT_FALSE(r.yield[1]) << c.label;
+        EXPECT_NEAR(c.mBal, MomentAt(c.section, c.material, true, c.nBal), 1e-6 * c.mBal);
+        EXPECT_NEAR(c.mBal, MomentAt(c.section, c.material, true, c.nBal, false), 1e-6 * c.mBal);
+        EXPECT_NEAR(c.m0, r.level.y.moment.pos, 1e-4 * c.m0) << c.label;
+        EXPECT_NEAR(c.m0, r.yield[4]->neg, 1e-4 * c.m0) << c.label;
+        // The largest moment of a symmetric section is at or close above the balanced point.
+        EXPECT_GE(r.level.y.momentMax.pos, c.mBal * (1 - 1e-9)) << c.label;
+        EXPECT_LE(r.level.y.momentMax.pos, c.mBal * 1.02) << c.label;
+        for (const T_PM_POINT& p : r.level.y.curves.pos)
+            EXPECT_NEAR(MomentAt(c.section, c.material, true, p.p * c.pure),
+                        p.m * r.level.y.momentMax.pos, 1e-6 * c.mBal)
+                << c.label << ' ' << p.p;
+    }
+}
+
+// Bars at the bottom (-z) alone: My(+) is the beam, T = 600 kN, x = T / (17/21 * 25 * 300) = 98.82,
+// M = T (450 - 99/238 x) = 245.336 kNm. Pure compression: bars 1500 (400 - 25) below the centroid.
+// At N = 2000 kN the neutral axis of My(+) is found by hand: 6071.43 x - 1500 s = 2e6, s = 700
+// (450 / x - 1), gives x = 367.967, s = 156.06 and M = C (250 - 0.41597 x) + 1500 s * 200.
+TEST(SectionStrength, BarsOnOneSideTellTheSignsApart)
+{
+    T_SECT_D s = Shape(SECT_SHAPE::Rectangle, {500, 300});
+    s.bars = {{100, -200, 750}, {-100, -200, 750}};
+    const T_MATL_D m = Concrete(25, 400);
+    const T_SECTION_STRENGTH r = Strength(s, m);
+    EXPECT_NEAR(245.3356e6, r.level.y.moment.pos, 1e3);
+    EXPECT_LT(r.level.y.moment.neg, 0.2 * r.level.y.moment.pos);
+    EXPECT_NEAR(-562500.0 * 200, r.level.y.curves.pos[0].m * r.level.y.momentMax.pos, 1);
+    EXPECT_NEAR(562500.0 * 200, r.level.y.curves.neg[0].m * r.level.y.momentMax.neg, 1);
+    EXPECT_NEAR(r.level.z.moment.pos, r.level.z.moment.neg, 1e-6 * r.level.z.moment.neg);
+    const double x = 367.967, bar = 1500 * 700 * (450 / x - 1), c = 2e6 + bar;
+    EXPECT_NEAR(2e6, 17.0 / 21 * 25 * 300 * x - bar, 2e2) << "the hand value of x";
+    EXPECT_NEAR(c * (250 - 99.0 / 238 * x) + bar * 200, MomentAt(s, m, true, 2e6), 1e5);
+    // The same column on its side bends about z: +y is compressed by Mz(+).
+    T_SECT_D side = Shape(SECT_SHAPE::Rectangle, {300, 500});
+    side.bars = {{-200, 100, 750}, {-200, -100, 750}};
+    EXPECT_NEAR(245.3356e6, Strength(side, m).level.z.moment.pos, 1e3);
+}
+
+// Strips of constant width and the strain from two edge values: another algorithm than the Gauss
+// points over the angle; the strip sum is good to about 1e-7.
+TEST(SectionStrength, CircularColumnAgreesWithAFineStripSum)
+{
+    constexpr double kR = 250, kFck = 30, kFyk = 500, kBar = 491;
+    T_SECT_D s = Shape(SECT_SHAPE::Circle, {2 * kR});
+    for (int i = 0; i < 8; ++i)
+        s.bars.push_back({190 * std::cos(pi * i / 4), 190 * std::sin(pi * i / 4), kBar});
+    const T_MATL_D m = Concrete(kFck, kFyk);
+    const auto concrete = [](double e) {
+        return e <= 0 ? 0.0 : e >= 0.002 ? kFck : kFck * (1000 * e - 250000 * e * e);
+    };
+    // Strains at the upper and lower edge: cut by the neutral axis, then through 0.002 at 3/7.
+    for (const auto& [top, bottom] : {std::pair{0.0035, -0.02},
+                                      {0.0035, -0.004},
+                                      {0.0035, -0.0012},
+                                      {0.0035, 0.0},
+                                      {0.00275, 0.001},
+                                      {0.0023, 0.0016}}) {
+        double n = 0, mom = 0;
+        const auto strain = [&](double z) { return bottom + (top - bottom) * (z + kR) / (2 * kR); };
+        constexpr int kStrips = 200000;
+        for (int i = 0; i < kStrips; ++i) {
+            const double z = -kR + (i + 0.5) * 2 * kR / kStrips;
+            const double f =
+                concrete(strain(z)) * 2 * std::sqrt(kR * kR - z * z) * 2 * kR / kStrips;
+            n += f;
+            mom += f * z;
+        }
+        for (const T_REBAR& b : s.bars) {
+            const double e = strain(b.z);
+            const double f = b.area * (std::min(kFyk, std::max(-kFyk, 200000 * e)) - concrete(e));
+            n += f;
+            mom += f * b.z;
+        }
+        EXPECT_NEAR(mom, MomentAt(s, m, true, n), 1e-6 * mom) << top << ' ' << bottom;
+        EXPECT_NEAR(mom, MomentAt(s, m, false, n), 1e-6 * mom) << "the bars repeat at 90 degrees";
+    }
+    const T_SECTION_STRENGTH r = Strength(s, m);
+    EXPECT_NEAR(kFck * pi * kR * kR + 8 * kBar * (400 - kFck), r.level.compression, 10);
+    EXPECT_NEAR(8 * kBar * kFyk, r.level.tension, 1e-3);
+}
+
+TEST(SectionStrength, RefusesWithItsReasonAndLeavesOutputAlone)
+{
+    const T_SECT_D good = Column(400, 400, 150, 150, 625);
+    T_SECT_D noBars = good, onEdge = good, noArea = good, allSteel = good;
+    noBars.bars.clear();
+    onEdge.bars[2].z = -200;
+    noArea.bars[1].area = 0;
+    allSteel.bars[0].area = 160000;
+    // One huge bar at a corner: the largest moment lies beyond pure compression, where a uniform
+    // 0.002 leaves the bar elastic.
+    T_SECT_D corner = Shape(SECT_SHAPE::Rectangle, {500, 300});
+    corner.bars = {{100, 150, 9000}};
+    T_SECT_D value;
+    value.area = 10;
+    T_MATL_D masonry = Concrete(30, 500), noModulus = masonry;
+    masonry.type = MATL_CLASS::Masonry;
+    noModulus.Es = 0;
+    struct T_CASE {
+        const char* label;
+        T_SECT_D section;
+        T_MATL_D material;
+        SECT_FAULT fault;
+    };
+    const T_CASE cases[] = {
+        {"no bars", noBars, Concrete(30, 500), SECT_FAULT::NoBars},
+        {"bar on the edge", onEdge, Concrete(30, 500), SECT_FAULT::Bars},
+        {"bar without area", noArea, Concrete(30, 500), SECT_FAULT::Bars},
+        {"more steel than section", allSteel, Concrete(30, 500), SECT_FAULT::Bars},
+        {"peak beyond pure compression", corner, Concrete(20, 600), SECT_FAULT::NotConverged},
+        {"fck", good, Concrete(kNan, 500), SECT_FAULT::Material},
+        {"fyk", good, Concrete(30, 0), SECT_FAULT::Material},
+        {"Es", good, noModulus, SECT_FAULT::Material},
+        {"Fy", kI, Steel(-1), SECT_FAULT::Material},
+        {"masonry", good, masonry, SECT_FAULT::Class},
+        {"concrete I", kI, Concrete(30, 500), SECT_FAULT::Shape},
+        {"no plastic modulus", value, Steel(235), SECT_FAULT::Values},
+        {"dimensions", Shape(SECT_SHAPE::Pipe, {10, 5}), Steel(235), SECT_FAULT::Dimensions},
+    };
+    for (const T_CASE& c : cases) {
+        T_SECTION_STRENGTH out;
+        out.level.tension = 77;
+        SECT_FAULT fault = SECT_FAULT::None;
+        EXPECT_EQ(0, CSectionStrength::Calc(c.section, c.material, out, fault)) << c.label;
+        EXPECT_EQ(c.fault, fault) << c.label;
+        EXPECT_EQ(77, out.level.tension) << c.label;
+    }
+    double moment = 77;
+    SECT_FAULT fault;
+    for (double axial : {5725001.0, -1250001.0, kNan}) {
+        EXPECT_EQ(0, CSectionStrength::CalcMoment(good, Concrete(30, 500), true, true, axial,
+                                                  moment, fault));
+        EXPECT_EQ(SECT_FAULT::Values, fault);
+        EXPECT_EQ(77, moment);
+    }
+}

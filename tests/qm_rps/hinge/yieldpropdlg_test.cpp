@@ -1,0 +1,264 @@
+#include "qm_rps/iehpyieldpropgrid2.h"
+#include "qm_rps/po_hingeyieldpropdlgnew.h"
+#include "qm_rps/po_hingeyieldpropgrid.h"
+#include "qm_rps/sectionstrength.h"
+#include "qm_rps/yieldstrengthcalcoptdlg.h"
+
+#include <functional>
+#include <gtest/gtest.h>
+#include <limits>
+
+namespace {
+
+constexpr double kNan = std::numeric_limits<double>::quiet_NaN();
+constexpr double kInf = std::numeric_limits<double>::infinity();
+
+T_YIELD_LEVEL Level()
+{
+    T_YIELD_LEVEL l;
+    l.tension = 1;
+    l.compression = 10;
+    T_PM_CURVE curve;
+    for (std::size_t i = 0; i < 10; ++i)
+        curve[i] = {1.0 - 0.12 * static_cast<double>(i), 0.5};
+    l.y = l.z = {true, {1, 1}, {2, 4}, {curve, curve}};
+    return l;
+}
+T_YIELD_SURFACE Surface()
+{
+    return {Level(), Level()};
+}
+
+struct T_RULE_CASE {
+    SKEL_TYPE type;
+    const char* rule; // null: passes
+    std::function<void(T_YIELD_SURFACE&)> edit;
+    const char* field = nullptr;
+};
+
+void Expect(const std::vector<T_RULE_CASE>& cases)
+{
+    for (const T_RULE_CASE& c : cases) {
+        SCOPED_TRACE(c.rule ? c.rule : "passes");
+        T_YIELD_SURFACE record = Surface();
+        CPO_HingeYieldPropDlgNew dlg(record, c.type);
+        c.edit(dlg.m_surface);
+        const T_YIELD_SURFACE before = record;
+        ASSERT_EQ(c.rule ? 0 : 1, dlg.OnOK());
+        if (!c.rule) continue;
+        EXPECT_EQ(before, record);
+        ASSERT_EQ(1u, dlg.Messages().size());
+        EXPECT_EQ("IDS_CMD_IEHP_YIELD", dlg.Messages()[0].key);
+        EXPECT_NE(std::string::npos, dlg.Messages()[0].text.find(c.rule));
+        const T_FINDING first = dlg.Findings().front();
+        EXPECT_EQ(c.rule, first.ruleText);
+        EXPECT_EQ(dlg.Messages()[0].text, first.text);
+        EXPECT_TRUE(!c.field || c.field == first.field) << first.field;
+    }
+}
+
+using S = T_YIELD_SURFACE;
+constexpr SKEL_TYPE kBi = SKEL_TYPE::Bilinear, kTri = SKEL_TYPE::Trilinear, kEc8 = SKEL_TYPE::Ec8;
+
+} // namespace
+
+TEST(YieldPropDlg, EveryStrengthOfItsLevelMustBePositive)
+{
+    Expect({
+        {kTri, nullptr, [](S&) {}},
+        {kTri, "PC(t) > 0", [](S& s) { s.crack->tension = 0; }, "crack.tension"},
+        {kTri, "Pmax(c) > 0", [](S& s) { s.crack->compression = -1e-9; }, "crack.compression"},
+        {kTri, "MCy(+) > 0", [](S& s) { s.crack->y.moment.pos = 0; }, "crack.y.moment.pos"},
+        {kTri, "MCz(+) > 0", [](S& s) { s.crack->z.moment.pos = kNan; }, "crack.z.moment.pos"},
+        {kTri, "MCy(-) > 0", [](S& s) { s.crack->y.moment.neg = 0; }, "crack.y.moment.neg"},
+        {kTri, "MCz(-) > 0", [](S& s) { s.crack->z.moment.neg = 0; }, "crack.z.moment.neg"},
+        {kTri, "MYy,max(+) > 0", [](S& s) { s.crack->y.momentMax.pos = 0; }},
+        {kTri, "MYz,max(+) > 0", [](S& s) { s.crack->z.momentMax.pos = 0; }},
+        {kTri, "MYy,max(-) > 0", [](S& s) { s.crack->y.momentMax.neg = 0; }},
+        {kTri, "MYz,max(-) > 0", [](S& s) { s.crack->z.momentMax.neg = 0; }},
+        {kTri, "PC(t) > 0", [](S& s) { s.crack.reset(); }},
+        {SKEL_TYPE::SlipTrilinear, "PC(t) > 0", [](S& s) { s.crack->tension = 0; }},
+        {kBi, nullptr, [](S& s) { s.crack.reset(); }},
+        {kBi, "PY(t) > 0", [](S& s) { s.yield.tension = 0; }, "yield.tension"},
+        {kBi, nullptr, [](S& s) { s.yield.tension = 1e-12; }},
+        {kBi, "Pmax(c) > 0", [](S& s) { s.yield.compression = kInf; }},
+        {kBi, "MYy(+) > 0", [](S& s) { s.yield.y.moment.pos = 0; }},
+        {kBi, "MYz(+) > 0", [](S& s) { s.yield.z.moment.pos = 0; }},
+        {kBi, "MYy(-) > 0", [](S& s) { s.yield.y.moment.neg = 0; }},
+        {kBi, "MYz(-) > 0", [](S& s) { s.yield.z.moment.neg = 0; }},
+        {kBi, "MUy,max(+) > 0", [](S& s) { s.yield.y.momentMax.pos = 0; }},
+        {kBi, "MUz,max(+) > 0", [](S& s) { s.yield.z.momentMax.pos = 0; }},
+        {kBi, "MUy,max(-) > 0", [](S& s) { s.yield.y.momentMax.neg = 0; }},
+        {kBi, "MUz,max(-) > 0", [](S& s) { s.yield.z.momentMax.neg = 0; }},
+        {kEc8, "PC0(t) > 0", [](S& s) { s.yield.tension = 0; }},
+        {kEc8, "MC0y(+) > 0", [](S& s) { s.yield.y.moment.pos = s.yield.y.momentMax.pos = 0; }},
+        {kEc8, "MUy,max(+) > 0", [](S& s) { s.yield.y.momentMax.pos = s.yield.z.moment.pos = 0; }},
+        {kEc8, "MC0z(+) > 0", [](S& s) { s.yield.z.moment.pos = s.yield.y.moment.neg = 0; }},
+        {kEc8, "MUz,max(+) > 0", [](S& s) { s.yield.z.momentMax.pos = s.yield.y.moment.neg = 0; }},
+        {kEc8, "MC0y(-) > 0", [](S& s) { s.yield.y.moment.neg = 0; }},
+        {kEc8, "MUy,max(-) > 0", [](S& s) { s.yield.y.momentMax.neg = s.yield.z.moment.neg = 0; }},
+        {kEc8, "MC0z(-) > 0", [](S& s) { s.yield.z.moment.neg = 0; }},
+        {kEc8, "MUz,max(-) > 0", [](S& s) { s.yield.z.momentMax.neg = 0; }},
+    });
+}
+
+TEST(YieldPropDlg, RatiosStayInsideOneAndAxialForcesFall)
+{
+    Expect({
+        {kBi, nullptr, [](S& s) { s.yield.y.curves.pos[3].m = 0.999; }},
+        {kBi, "-1 < M/MY,max(+) < 1", [](S& s) { s.yield.y.curves.pos[3].m = 1.0; },
+         "yield.y.curves.pos[3].m"},
+        {kBi, nullptr, [](S& s) { s.yield.z.curves.neg[9].m = -0.999; }},
+        {kBi, "-1 < M/MY,max(-) < 1", [](S& s) { s.yield.z.curves.neg[9].m = -1.0; },
+         "yield.z.curves.neg[9].m"},
+        {kBi, "-1 < M/MY,max(-) < 1", [](S& s) { s.yield.z.curves.neg[0].m = kNan; }},
+        {kBi, "P/Pmax(t)", [](S& s) { s.yield.y.curves.pos[7].p = s.yield.y.curves.pos[6].p; },
+         "yield.y.curves.pos[7].p"},
+        {kBi, "P/Pmax(t)", [](S& s) { s.yield.z.curves.neg[9].p = kNan; }},
+        {kBi, "P/Pmax(c)", [](S& s) { s.yield.y.curves.neg[4].p = s.yield.y.curves.neg[3].p; },
+         "yield.y.curves.neg[4].p"},
+        {kBi, "P/Pmax(c)", [](S& s) { s.yield.z.curves.pos[0].p = kInf; }},
+        // From A(c) to A(t) there is no rule: the tension side starts anew.
+        {kBi, nullptr, [](S& s) { s.yield.y.curves.pos[5].p = 0.7; }},
+        // Strengths come before ratios, ratios before axial forces, over all levels.
+        {kTri, "PY(t) > 0", [](S& s) { s.crack->y.curves.pos[0].m = 1, s.yield.tension = 0; }},
+        {kTri, "-1 < M/MY,max(+) < 1",
+         [](S& s) { s.crack->y.curves.pos[9].p = 1, s.yield.z.curves.pos[9].m = 1; }},
+        // Tension before compression on a curve; (+) before (-) at a point.
+        {kBi, "P/Pmax(t)",
+         [](S& s) { s.yield.y.curves.pos[1].p = 2, s.yield.y.curves.pos[9].p = 1; }},
+        {kBi, "-1 < M/MY,max(-) < 1",
+         [](S& s) { s.yield.y.curves.neg[1].m = 1, s.yield.y.curves.pos[2].m = 1; }},
+    });
+}
+
+TEST(YieldPropDlg, AnUnusedAxisIsNotChecked)
+{
+    T_YIELD_SURFACE record = Surface();
+    record.yield.z = {false, {0, 0}, {0, 0}, {}};
+    CPO_HingeYieldPropDlgNew dlg(record, kBi);
+    EXPECT_EQ(1, dlg.OnOK());
+    EXPECT_EQ("IDS_RPS_PO_Z_AXIS_NOT_USED", dlg.AxisNoteKey(false));
+    EXPECT_EQ("", dlg.AxisNoteKey(true));
+    dlg.m_surface.yield.z.used = true;
+    EXPECT_EQ(0, dlg.OnOK());
+    dlg.m_surface.yield.y = {false, {0, 0}, {0, 0}, {}};
+    dlg.m_surface.yield.z = Level().z;
+    EXPECT_EQ(1, dlg.OnOK());
+    EXPECT_EQ(dlg.m_surface, record);
+}
+
+TEST(YieldPropDlg, ListsEveryFindingInTheOrderOfTheCheck)
+{
+    T_YIELD_SURFACE record = Surface();
+    record.yield.z.moment.neg = 0;
+    record.yield.y.curves.pos[2].m = 1;
+    record.yield.z.curves.pos[8].p = 5;
+    const CPO_HingeYieldPropDlgNew dlg(record, kBi);
+    const std::vector<T_FINDING> f = dlg.Findings();
+    ASSERT_EQ(3u, f.size());
+    EXPECT_EQ("MYz(-) > 0", f[0].ruleText);
+    EXPECT_EQ(HINGE_SIDE::Negative, f[0].side);
+    EXPECT_EQ(5, f[0].component);
+    EXPECT_EQ("C(c)", f[1].point);
+    EXPECT_EQ("D(t)", f[2].point);
+    T_YIELD_LEVEL l = Level();
+    l.z.momentMax.neg = -9;
+    EXPECT_EQ(9, CPO_HingeYieldPropDlgNew::MomentNormaliser(l));
+}
+
+TEST(YieldPropDlg, AcceptsWhatTheSectionCalculationGives)
+{
+    T_SECT_D i, column;
+    i.shape = SECT_SHAPE::IShape;
+    i.size = {300, 150, 7.1, 10.7};
+    column.shape = SECT_SHAPE::Rectangle;
+    column.size = {500, 300};
+    column.bars = {{100, -200, 900}, {-100, -200, 900}, {0, 200, 400}};
+    T_MATL_D steel, concrete;
+    steel.Fy = 235;
+    concrete.type = MATL_CLASS::Concrete;
+    concrete.fck = 30;
+    concrete.fyk = 450;
+    concrete.Es = 200000;
+    for (const auto& [section, material] : {std::pair{i, steel}, {column, concrete}}) {
+        T_SECTION_STRENGTH strength;
+        SECT_FAULT fault;
+        ASSERT_EQ(1, CSectionStrength::Calc(section, material, strength, fault));
+        T_YIELD_SURFACE record{std::nullopt, strength.level};
+        CPO_HingeYieldPropDlgNew dlg(record, kBi);
+        EXPECT_EQ(1, dlg.CheckData());
+    }
+}
+
+TEST(YieldPropGrid, ShowsRatiosOrValuesAndStoresRatios)
+{
+    T_YIELD_LEVEL level = Level();
+    level.z.curves.neg[1] = {1.0 / 3, 0.25};
+    CPO_HingeYieldPropGrid grid(level, false);
+    EXPECT_EQ("0.333333333333333", grid.CellText(1, 2));
+    EXPECT_EQ("M/MYz,max(-)", grid.ColumnHead(3));
+    EXPECT_EQ("A(t)", grid.RowHead(5));
+    grid.m_showValue = true;
+    EXPECT_EQ("1", grid.CellText(1, 3)); // 0.25 * 4
+    EXPECT_EQ("Mz(-)", grid.ColumnHead(3));
+    EXPECT_EQ(1, grid.SetCellText(1, 3, "3"));
+    EXPECT_EQ(0.75, level.z.curves.neg[1].m);
+    EXPECT_EQ(1, grid.SetCellText(1, 1, "1"));
+    EXPECT_EQ(0.5, level.z.curves.pos[1].m);
+    EXPECT_EQ(1, grid.SetCellText(1, 0, "5"));
+    EXPECT_EQ(0.5, level.z.curves.pos[1].p);
+    const T_YIELD_LEVEL before = level;
+    for (const char* text : {"1,5", "nan", "", "1e999", "two"})
+        EXPECT_EQ(0, grid.SetCellText(1, 3, text)) << text;
+    EXPECT_EQ(0, grid.SetCellText(10, 0, "1"));
+    EXPECT_EQ(0, grid.SetCellText(0, 4, "1"));
+    EXPECT_EQ(before, level);
+    for (double scale : {0.0, -4.0}) {
+        level.z.momentMax.neg = scale;
+        EXPECT_EQ(0, grid.SetCellText(1, 3, "3")) << "a value without a scale has no ratio";
+    }
+
+    T_PM_CURVE curve{};
+    CIehpYieldPropGrid2 old(curve);
+    EXPECT_EQ(1, old.SetCellText(9, 1, "-0.125"));
+    EXPECT_EQ(-0.125, curve[9].m);
+    EXPECT_EQ("E(t)", old.RowHead(9));
+}
+
+TEST(YieldStrengthCalcOpt, CodePairsFixTheMode)
+{
+    using E = YIELD_CODE;
+    struct T_CASE {
+        const char *concrete, *steel;
+        E code;
+    };
+    const T_CASE cases[] = {
+        {"Eurocode2", "Eurocode3", E::Eurocode},      {"Eurocode2", "Eurocode3:05", E::Eurocode},
+        {"Eurocode2:04", "Eurocode3", E::Eurocode},   {"Eurocode2:04", "Eurocode3:05", E::Eurocode},
+        {"AIJ-WSD99", "AIJ-ASD02", E::Aij},           {"Eurocode2:04", "AIJ-ASD02", E::General},
+        {"AIJ-WSD99", "Eurocode3", E::General},       {"Eurocode3", "Eurocode2", E::General},
+        {"Eurocode2:05", "Eurocode3:05", E::General}, {"", "", E::General},
+    };
+    for (const T_CASE& c : cases)
+        EXPECT_EQ(c.code, CYieldStrengthCalcOptDlg::CodeOf(c.concrete, c.steel))
+            << c.concrete << ' ' << c.steel;
+}
+
+TEST(YieldStrengthCalcOpt, RefusesASelectionOfAnotherKind)
+{
+    CYieldStrengthCalcOptDlg dlg(HINGE_ELEMENT::BeamColumn);
+    EXPECT_EQ(1, dlg.OnSelectElemChk(true, {{7}, {3}}));
+    T_YIELD_CALC_OPT data;
+    dlg.GetData(data);
+    const T_YIELD_CALC_OPT selected{true, {3, 7}};
+    EXPECT_EQ(selected, data);
+    EXPECT_EQ(0, dlg.OnSelectElemChk(true, {{1}, {2, HINGE_ELEMENT::Wall}}));
+    ASSERT_EQ(1u, dlg.Messages().size());
+    EXPECT_EQ("IDS_CMD2_SOD_SEL_ELEM_WRONG_ELEM", dlg.Messages()[0].key);
+    dlg.GetData(data);
+    EXPECT_EQ(selected, data);
+    EXPECT_EQ(1, dlg.OnSelectElemChk(false, {{2, HINGE_ELEMENT::Wall}}));
+    dlg.GetData(data);
+    EXPECT_EQ(T_YIELD_CALC_OPT{}, data);
+}

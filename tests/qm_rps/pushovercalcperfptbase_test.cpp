@@ -1,0 +1,294 @@
+// The operations that every procedure is built on, through the plainest calculator.
+#include "qm_rps/pushovercalcperfptproca.h"
+
+#include "perfptfixture.h"
+#include "qm_base/appbase.h"
+
+#include <cmath>
+#include <gtest/gtest.h>
+
+namespace {
+
+using CALC = CPushOverCalcPerfPtProcA;
+
+const T_POINTS kTrapezoid{{0.0, 0.0}, {1.0, 1.0}, {2.0, 1.5}, {4.0, 2.0}};
+
+struct T_KIT {
+    CTestRecord record;
+    CALC calc{record};
+    explicit T_KIT(const T_POINTS& capacity, const T_DAMP_PARAM& damping = {},
+                   decltype(T_SPFC_D::data) spectrum = Level(3.0))
+        : record(capacity, std::move(spectrum), damping, kGravityUnit)
+    {
+    }
+};
+
+std::vector<std::string> TakeSources()
+{
+    std::vector<std::string> sources;
+    for (const T_ASSERTION& a : CAppBase::TakeAssertions_ST())
+        sources.push_back(a.source);
+    return sources;
+}
+const std::vector<std::string> kOneAssertion{"src/qm_rps/pushovercalcperfptbase"};
+
+} // namespace
+
+TEST(PerfPtBase, CapacityAreaIsTrapezoidalFromTheFirstStoredPoint)
+{
+    T_KIT k(kTrapezoid);
+    const double worked[][2] = {{0.0, 0.0},  {0.5, 0.125}, {1.0, 0.5},  {1.5, 1.0625},
+                                {2.0, 1.75}, {3.0, 3.375}, {4.0, 5.25}, {9.0, 5.25}};
+    for (const auto& [d, expected] : worked) {
+        double area = -1.0;
+        EXPECT_EQ(1, k.calc.CalcCapacityArea(d, area));
+        EXPECT_NEAR(expected, area, 1e-14) << d;
+    }
+    T_KIT late({{0.1, 0.1}, {1.0, 1.0}, {4.0, 1.0}}); // the triangle before 0.1 is not counted
+    double area = -1.0;
+    EXPECT_EQ(1, late.calc.CalcCapacityArea(2.0, area));
+    EXPECT_NEAR(1.495, area, 1e-14);
+    EXPECT_EQ(1, late.calc.CalcCapacityArea(0.05, area));
+    EXPECT_EQ(0.0, area);
+}
+
+TEST(PerfPtBase, BilinearHasTheAreaOfTheCurveAndItsInitialStiffness)
+{
+    struct T_CASE {
+        const char* label;
+        T_POINTS capacity;
+        double dpi, api, dy, ay;
+    };
+    const T_POINTS hump{{0.0, 0.0}, {1.0, 1.0}, {2.0, 4.0}, {3.0, 1.0}};
+    const T_CASE cases[] = {
+        // by hand: dy = Sd1 (2 area - api dpi) / (Sa1 dpi - Sd1 api)
+        {"end of the trapezoid", kTrapezoid, 4.0, 2.0, 1.25, 1.25},
+        {"inside it", kTrapezoid, 3.0, 1.75, 1.2, 1.2},
+        {"from a tenth of the step",
+         {{0.1, 0.1}, {1.0, 1.0}, {2.0, 1.5}, {4.0, 2.0}},
+         4.0,
+         2.0,
+         1.245,
+         1.245},
+        {"plateau", {{0.0, 0.0}, {2.0, 1.0}, {6.0, 1.0}}, 6.0, 1.0, 2.0, 1.0},
+        {"stiffness of 1/2", {{0.0, 0.0}, {2.0, 1.0}, {6.0, 2.0}}, 6.0, 2.0, 2.0, 1.0},
+        {"clamped to the trial point", hump, 3.0, 1.0, 3.0, 1.0},
+        {"within 0.1 of the stiffness", kTrapezoid, 2.0, 1.91, 2.0, 1.91},
+        {"trial at the first point", kTrapezoid, 1.0, 1.0, 1.0, 1.0},
+        {"within 1e-12 of it", kTrapezoid, 1.0 + 5e-13, 0.7, 1.0 + 5e-13, 0.7},
+    };
+    for (const T_CASE& c : cases) {
+        T_KIT k(c.capacity);
+        double dy = 0.0, ay = 0.0;
+        EXPECT_EQ(1, k.calc.BilinearizeAt(c.dpi, c.api, dy, ay)) << c.label;
+        EXPECT_NEAR(c.dy, dy, 1e-14) << c.label;
+        EXPECT_NEAR(c.ay, ay, 1e-14) << c.label;
+    }
+    T_KIT k(kTrapezoid); // just outside 0.1: ratio 0.89, dy = (2 * 1.75 - 2 * 1.89) / 0.11 < 0
+    double dy = 7.0, ay = 8.0;
+    EXPECT_EQ(0, k.calc.BilinearizeAt(2.0, 1.89, dy, ay));
+    EXPECT_EQ(7.0, dy);
+    EXPECT_EQ(8.0, ay);
+}
+
+TEST(PerfPtBase, BilinearRefusesZeroPointsAndCurvesWithTooLittleArea)
+{
+    double dy = 7.0, ay = 8.0;
+    T_KIT dip({{0.0, 0.0}, {1.0, 1.0}, {2.0, 0.0}, {3.0, 0.0}, {4.0, 2.0}}); // area 2: dy = -2
+    TakeSources();
+    EXPECT_EQ(0, dip.calc.BilinearizeAt(4.0, 2.0, dy, ay));
+    EXPECT_TRUE(TakeSources().empty()) << "a property of the curve, not of the program";
+    T_KIT k(kTrapezoid), flat({{0.0, 0.0}, {1.0, 0.0}, {2.0, 1.0}}),
+        upright({{0.0, 0.0}, {0.0, 1.0}, {2.0, 2.0}});
+    EXPECT_EQ(0, k.calc.BilinearizeAt(0.0, 1.0, dy, ay));
+    EXPECT_EQ(kOneAssertion, TakeSources());
+    EXPECT_EQ(0, k.calc.BilinearizeAt(1.0, 9e-14, dy, ay));
+    EXPECT_EQ(0, flat.calc.BilinearizeAt(2.0, 1.0, dy, ay));
+    EXPECT_EQ(0, upright.calc.BilinearizeAt(2.0, 2.0, dy, ay));
+    EXPECT_EQ(3u, TakeSources().size());
+    EXPECT_EQ(7.0, dy);
+    EXPECT_EQ(8.0, ay);
+}
+
+// ATC-40 (1996) Table 8-1. The fraction is held at 0.5, so that each knee shows as a jump.
+TEST(PerfPtBase, KappaFollowsTheBehaviourType)
+{
+    struct T_CASE {
+        int type;
+        double beta0, kappa;
+    };
+    const T_CASE cases[] = {{0, 0.0, 1.0},  {0, 16.25, 1.0}, {0, 16.26, 0.875}, // 1.13 - 0.255
+                            {1, 0.0, 0.67}, {1, 25.0, 0.67}, {1, 25.01, 0.622}, // .845 - .223
+                            {2, 0.0, 0.33}, {2, 45.0, 0.33}, {4, 10.0, 0.0},    {-1, 10.0, 0.0}};
+    T_KIT k(kTrapezoid);
+    for (const T_CASE& c : cases) {
+        double beta0 = c.beta0;
+        EXPECT_NEAR(c.kappa, k.calc.GetDampingModificationFactor(c.type, beta0, 0.5), 1e-14)
+            << c.type << " " << c.beta0;
+        EXPECT_EQ(c.beta0, beta0);
+    }
+}
+
+TEST(PerfPtBase, UserKappaIsInterpolatedAndLimitsTheDampingItself)
+{
+    struct T_CASE {
+        double beta1, beta2, beta0, kappa, limited;
+    };
+    const T_CASE cases[] = {// kappa1 0.9, kappa2 0.5
+                            {10, 30, 5, 0.9, 5},   {10, 30, 10, 0.9, 10}, {10, 30, 15, 0.8, 15},
+                            {10, 30, 30, 0.5, 30}, {10, 30, 31, 0.5, 30}, {20, 20, 20, 0.9, 20},
+                            {20, 20, 21, 0.5, 20}};
+    for (const T_CASE& c : cases) {
+        T_KIT k(kTrapezoid, {3, 5.0, c.beta1, 0.9, c.beta2, 0.5});
+        double beta0 = c.beta0;
+        EXPECT_NEAR(c.kappa, k.calc.GetDampingModificationFactor(3, beta0, 0.1), 1e-14) << c.beta0;
+        EXPECT_EQ(c.limited, beta0) << c.beta1 << " " << c.beta0;
+    }
+}
+
+TEST(PerfPtBase, EffectiveDampingAndReductionOfABilinearSystem)
+{
+    struct T_CASE {
+        const char* label;
+        T_DAMP_PARAM damping;
+        double dpi, beta, SRa, SRv;
+    };
+    // Yield at (1, 1), plateau: the fraction is (mu - 1) / mu. Pocket calculator.
+    const T_CASE cases[] = {
+        {"A, 31.85 %", {0}, 2.0, 32.86875, 0.393908, 0.532161},
+        {"A, cut to 45 %", {0}, 10.0, 39.637284, 0.333847, 0.485633},
+        {"B, cut to 45 %", {1}, 10.0, 28.846821, 0.435774, 0.564594},
+        {"C, cut to 45 %", {2}, 10.0, 19.85, 0.555670, 0.657477},
+        {"other elastic damping", {2, 2.0}, 10.0, 16.85, 0.608227, 0.698192},
+        {"no hysteresis", {0}, 1.0, 5.0, 0.997916, 1.000079},
+        {"user, beta0 limited to 30", {3, 5.0, 10, 0.9, 30, 0.5}, 2.0, 20.0, 0.553256, 0.655606},
+    };
+    for (const T_CASE& c : cases) {
+        T_KIT k(kTrapezoid, c.damping);
+        double SRa = 0.0, SRv = 0.0, beta = 0.0;
+        EXPECT_EQ(1, k.calc.CalcSpectralReductionFactors(1.0, 1.0, c.dpi, 1.0, SRa, SRv, beta));
+        EXPECT_NEAR(c.beta, beta, 5e-7) << c.label;
+        EXPECT_NEAR(c.SRa, SRa, 5e-7) << c.label;
+        EXPECT_NEAR(c.SRv, SRv, 5e-7) << c.label;
+    }
+}
+
+TEST(PerfPtBase, NegativeOrUndefinedDampingIsRefused)
+{
+    T_KIT k(kTrapezoid, {3, 5.0, 10, -2.0, 30, -2.0});
+    double SRa = 7.0, SRv = 8.0, beta = 9.0;
+    TakeSources();
+    EXPECT_EQ(0, k.calc.CalcSpectralReductionFactors(1.0, 1.0, 2.0, 1.0, SRa, SRv, beta)); // -55
+    EXPECT_EQ(kOneAssertion, TakeSources());
+    EXPECT_EQ(0, k.calc.CalcSpectralReductionFactors(1.0, 1.0, 0.0, 0.0, SRa, SRv, beta)) << "0/0";
+    T_KIT none(kTrapezoid, {4, 0.0}); // kappa 0, nothing elastic: no logarithm
+    EXPECT_EQ(0, none.calc.CalcSpectralReductionFactors(1.0, 1.0, 2.0, 1.0, SRa, SRv, beta));
+    EXPECT_EQ(7.0, SRa);
+    EXPECT_EQ(8.0, SRv);
+    EXPECT_EQ(9.0, beta);
+}
+
+TEST(PerfPtBase, ElasticDampingIsBelowTheSettingOrAtTheConstantFive)
+{
+    struct T_CASE {
+        double setting, beta;
+        bool elastic;
+    };
+    const T_CASE cases[] = {{7.0, 6.99, true},   {7.0, 7.0, false},    {7.0, 5.0, true},
+                            {2.0, 1.99, true},   {2.0, 2.0, false},    {2.0, 5.0009, true},
+                            {2.0, 4.9991, true}, {2.0, 5.0011, false}, {2.0, 4.9989, false}};
+    for (const T_CASE& c : cases)
+        EXPECT_EQ(c.elastic, T_KIT(kTrapezoid, {0, c.setting}).calc.IsElasticDamping(c.beta))
+            << c.setting << " " << c.beta;
+}
+
+TEST(PerfPtBase, CapacityAccelerationIsNotFoundAtTheLastPoint)
+{
+    T_KIT k({{0.5, 0.5}, {1.0, 1.0}, {2.0, 1.5}, {1.5, 2.0}, {3.0, 0.0}}); // turns back
+    const double worked[][2] = {{0.5, 0.5}, {0.75, 0.75}, {1.0, 1.0}, {1.8, 1.4}, {2.0, 4.0 / 3.0}};
+    for (const auto& [d, expected] : worked) {
+        double a = -1.0;
+        EXPECT_EQ(1, k.calc.GetCapacityAccelAt(d, a)) << d;
+        EXPECT_NEAR(expected, a, 1e-14) << d;
+    }
+    double a = 7.0;
+    for (const double d : {0.49, 3.0, 3.1, std::nan("")})
+        EXPECT_EQ(0, k.calc.GetCapacityAccelAt(d, a)) << d;
+    EXPECT_EQ(7.0, a);
+}
+
+TEST(PerfPtBase, FirstSlopeChangeIsMeasuredRelativeToThePointBefore)
+{
+    struct T_CASE {
+        const char* label;
+        T_POINTS capacity;
+        int result;
+        T_POINT2 point;
+        std::size_t assertions;
+    };
+    const T_CASE cases[] = {
+        {"one segment", {{1, 1}, {2, 2}}, 0, {0, 0}, 0},
+        {"straight", {{1, 1}, {2, 2}, {3, 3}, {4, 4}}, 0, {4, 4}, 0},
+        {"turns at 2", {{1, 1}, {2, 2}, {3, 2.5}, {4, 4}}, 1, {2, 2}, 0}, // 1 against 0.5
+        {"turns at 3", {{1, 1}, {2, 2}, {3, 3}, {4, 3.2}}, 1, {3, 3}, 0},
+        {"by 0.09 only", {{1, 1}, {2, 2}, {3, 2.91}}, 0, {3, 2.91}, 0}, // 1 against 0.91
+        {"by 0.11", {{1, 1}, {2, 2}, {3, 2.89}}, 1, {2, 2}, 0},
+        {"from the origin", {{0, 0}, {1, 1}, {2, 1.2}}, 0, {0, 0}, 1},
+        {"through zero", {{1, 1}, {2, 0}, {3, 1}}, 0, {0, 0}, 1},
+        {"to zero", {{1, 1}, {2, 2}, {3, 3}, {4, 0}}, 1, {3, 3}, 0},
+    };
+    for (const T_CASE& c : cases) {
+        T_KIT k(c.capacity);
+        TakeSources();
+        T_POINT2 p;
+        EXPECT_EQ(c.result, k.calc.FindFirstSlopeChange(p.x, p.y)) << c.label;
+        EXPECT_EQ(c.point.x, p.x) << c.label;
+        EXPECT_EQ(c.point.y, p.y) << c.label;
+        EXPECT_EQ(c.assertions, TakeSources().size()) << c.label;
+    }
+}
+
+TEST(PerfPtBase, InitialTrialPointKeepsTheElasticDisplacement)
+{
+    // Sd = T2 Sa: demand (0, 1), (1, 1), (1, 0.25); the line of stiffness 1/2 meets it at (1, 0.5).
+    const T_SPFC_USER demand{{0.0, 1.0, 2.0}, {1.0, 1.0, 0.25}, {}};
+    T_KIT k({{0.0, 0.0}, {0.5, 0.25}, {2.0, 0.55}}, {}, demand);
+    double dpi = -1.0, api = -1.0, Dd = -1.0, Ad = -1.0;
+    ASSERT_EQ(1, k.calc.FindInitialTrialPoint(0.5, 0.25, dpi, api, Dd, Ad));
+    EXPECT_NEAR(1.0, Dd, 1e-12);
+    EXPECT_NEAR(0.5, Ad, 1e-12);
+    EXPECT_NEAR(1.0, dpi, 1e-12);
+    EXPECT_NEAR(0.35, api, 1e-12);
+
+    const T_RUN soft = RunPerfPt<CALC>(
+        *std::make_unique<CTestRecord>(T_POINTS{{0.0, 0.0}, {9.0, 1.0}, {18.0, 2.0}}, demand,
+                                       T_DAMP_PARAM{}, kGravityUnit)); // T = 3 s > 2 s
+    EXPECT_EQ(0, soft.result);
+    EXPECT_EQ(PUSH_OUTCOME::NoTrialPoint, soft.outcome.code);
+    const T_RUN shortCurve = RunPerfPt<CALC>(*std::make_unique<CTestRecord>(
+        T_POINTS{{0.0, 0.0}, {0.4, 0.2}, {0.9, 0.3}}, demand, T_DAMP_PARAM{}, kGravityUnit));
+    EXPECT_EQ(0, shortCurve.result);
+    EXPECT_EQ(PUSH_OUTCOME::TrialBeyond, shortCurve.outcome.code);
+    EXPECT_EQ(-1.0, shortCurve.D) << "left alone";
+    EXPECT_TRUE(shortCurve.trace.empty());
+    EXPECT_EQ("trial point not found", OutcomeName(shortCurve.outcome));
+    EXPECT_FALSE(OutcomeAdvice(soft.outcome) == OutcomeAdvice(shortCurve.outcome));
+}
+
+TEST(PerfPtBase, CrossingsOfSegmentsAndPeriodLines)
+{
+    T_KIT k({{0.0, 0.0}, {1.0, 1.0}, {3.0, 1.0}, {5.0, 3.0}});
+    T_POINT2 p{7.0, 8.0};
+    EXPECT_EQ(0, k.calc.IntersectSegmentWithCapacity({0.0, 2.0}, {1.0, 2.0}, p));
+    EXPECT_EQ(7.0, p.x);
+    EXPECT_EQ(1, k.calc.IntersectSegmentWithCapacity({4.0, 3.0}, {0.0, -1.0 / 3.0}, p)); // twice
+    EXPECT_NEAR(1.6, p.x, 1e-12) << "the first capacity segment, not the first of the line";
+    EXPECT_NEAR(1.0, p.y, 1e-12);
+    double D = 7.0, A = 8.0;
+    EXPECT_EQ(1, k.calc.IntersectPeriodLineWithCurve({0.0, 9.0}, {2.0, 2.0}, 1.5, D, A));
+    EXPECT_NEAR(4.5, D, 1e-12); // T2 Sa
+    EXPECT_NEAR(2.0, A, 1e-12);
+    EXPECT_EQ(0, k.calc.IntersectPeriodLineWithCurve({0.0, 9.0}, {2.0, 2.0}, 3.0, D, A));
+    EXPECT_EQ(0.0, D);
+    EXPECT_EQ(0.0, A);
+}

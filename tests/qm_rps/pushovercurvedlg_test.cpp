@@ -1,0 +1,459 @@
+#include "qm_rps/pushovercurvedlg.h"
+
+#include "pushsample.h"
+#include "qm_base/appbase.h"
+
+#include <algorithm>
+#include <gtest/gtest.h>
+#include <limits>
+
+namespace {
+
+/// Elastic-perfectly plastic push of the sample: Sd = 0.03/Gamma, Sa = 10/(alpha W) at yield, so
+/// dy/ay = 0.09 and, with g = 10, det = Se * 0.09. "U": Se = 0.5 to 0.1 s, 0.45 beyond, Tc = 0.1;
+/// "S": constant 0.5, Tc = 4; "N": an NTC record with SLV alone; "0": an NTC record without states.
+T_MODEL_CONTENT Plastic()
+{
+    T_MODEL_CONTENT c = ThreeMasses({0.03, 0.06, 0.09, 0.12}, {10, 10, 10, 10});
+    c.model.spectra[1] = {"U", T_SPFC_USER{{0, 0.1, 0.2, 4}, {0.5, 0.5, 0.45, 0.45}, {}}};
+    c.model.spectra[2] = {"S", T_SPFC_USER{{0, 4}, {0.5, 0.5}, {}}};
+    T_SPFC_NTC ntc;
+    c.model.spectra[4] = {"0", ntc};
+    ntc.states[2] = T_SPFC_NTC_STATE{0.2, 2.5, 0.1};
+    c.model.spectra[3] = {"N", ntc};
+    return c;
+}
+
+T_EVAL_D Eval(PUSH_METHOD method, const char* spectrum = "U")
+{
+    T_EVAL_D e;
+    e.name = "E";
+    e.push = "PX";
+    e.method = method;
+    e.spectrum = spectrum;
+    return e;
+}
+
+/// A driver with its document, evaluated once.
+struct T_RUN {
+    CDBDoc doc;
+    CPushOverCurveDlg dlg{doc};
+    int result = -1;
+
+    T_RUN(const T_MODEL_CONTENT& content, const T_EVAL_D& eval)
+    {
+        doc.Data().Assign(content);
+        EXPECT_EQ(1, dlg.SetEvaluation(eval)) << dlg.SettingsError();
+        CAppBase::TakeAssertions_ST();
+        result = dlg.Evaluate();
+    }
+    const T_PUSH_EVALUATION& R() const { return dlg.Result(); }
+    bool Said(const char* key) const
+    {
+        return std::ranges::any_of(R().messages, [&](const auto& m) { return m.key == key; });
+    }
+    std::vector<int> Steps(bool ntc)
+    {
+        std::array<int, 3> s{};
+        CPoverInfo* info = doc.Post().GetPoverInfo();
+        const int found = ntc ? info->GetStepNTC2008(1, s) : info->GetStepEC8(1, s);
+        return found ? std::vector<int>(s.begin(), s.end()) : std::vector<int>{};
+    }
+};
+
+constexpr const char* kNoTarget = "IDS_RPS_FAILED_FINDING_TARGET_DISPLACEMENT";
+constexpr const char* kNoPoint = "IDS_RPS_FAILED_FINDING_PERFORMANCE_POINT";
+
+struct T_FAIL_CASE {
+    const char* label;
+    PUSH_METHOD method;
+    bool eigen;
+    void (*change)(T_MODEL&);
+    PUSH_OUTCOME outcome;
+    const char* key;
+};
+
+void Vertical(T_MODEL& m)
+{
+    m.pushovers[1].direction = 3;
+}
+void NoModes(T_MODEL& m)
+{
+    m.modes.clear();
+}
+void OtherMode(T_MODEL& m)
+{
+    m.pushovers[1].patternKind = 2;
+    m.pushovers[1].modes = {1};
+}
+void NoMass(T_MODEL& m)
+{
+    for (auto& entry : m.nodes)
+        entry.second.mass = {};
+}
+
+// clang-format off
+const T_FAIL_CASE kFails[] = {
+    { "vertical, ATC-40",   PUSH_METHOD::Atc40,   true,  Vertical,  PUSH_OUTCOME::ConversionFailed, "IDS_QM_VERTICAL_PUSH" },
+    { "vertical, EC8",      PUSH_METHOD::Ec8Opcm, true,  Vertical,  PUSH_OUTCOME::ConversionFailed, "IDS_QM_VERTICAL_PUSH" },
+    { "no modes",           PUSH_METHOD::Fema440, true,  NoModes,   PUSH_OUTCOME::NoEigen, "IDS_PUSHOVER_The_eigen_value_analysis_is_not_perfor" },
+    { "no modes, mass",     PUSH_METHOD::Ntc2018, false, NoModes,   PUSH_OUTCOME::NoEigen, "IDS_PUSHOVER_The_eigen_value_analysis_is_not_perfor" },
+    { "eigen error, EC8",   PUSH_METHOD::Ec8Opcm, true,  OtherMode, PUSH_OUTCOME::EigenError, "IDS_RPS_PO_CURVE_ERROR_EIGEN" },
+    { "eigen error, NTC",   PUSH_METHOD::Ntc2008, true,  OtherMode, PUSH_OUTCOME::EigenError, "IDS_RPS_PO_CURVE_ERROR_EIGEN" },
+    { "eigen error, ATC",   PUSH_METHOD::Atc40,   true,  OtherMode, PUSH_OUTCOME::ConversionFailed, "IDS_QM_NO_CONVERSION" },
+    { "no mass",            PUSH_METHOD::Atc40,   false, NoMass,    PUSH_OUTCOME::ConversionFailed, "IDS_QM_NO_CONVERSION" },
+};
+// clang-format on
+
+} // namespace
+
+// A constant demand of 0.2 crosses the elastic branch (0.09 length per g). At 5 % the reduction
+// formulas do not give exactly 1: ATC-40 (8-9) (3.21 - 0.68 ln 5)/2.12, FEMA 440 (5.6 - ln 5)/4.
+TEST(PushOverCurveDlg, ElasticPointByHand)
+{
+    T_MODEL_CONTENT c = Plastic();
+    c.model.spectra[1] = {"U", T_SPFC_USER{{0, 4}, {0.2, 0.2}, {}}};
+    struct T_ROW {
+        PUSH_METHOD method;
+        char procedure;
+        double Sa;
+    };
+    const double atc = 0.2 * (3.21 - 0.68 * std::log(5.0)) / 2.12;
+    const double fema = 0.2 * (5.6 - std::log(5.0)) / 4.0;
+    for (const T_ROW& r :
+         {T_ROW{PUSH_METHOD::Atc40, 'A', atc}, T_ROW{PUSH_METHOD::Fema440, 'A', fema},
+          T_ROW{PUSH_METHOD::Fema440, 'B', fema}}) {
+        T_EVAL_D eval = Eval(r.method);
+        eval.procedure = r.procedure;
+        T_RUN run(c, eval);
+        const std::string label = std::string(MethodName(r.method)) + r.procedure;
+        ASSERT_EQ(2, run.result) << label;
+        const T_PERF_POINT& p = run.R().point.value();
+        EXPECT_NEAR(0.09 * r.Sa, p.Sd, 1e-12) << label;
+        EXPECT_NEAR(r.Sa, p.Sa, 1e-12) << label;
+        EXPECT_NEAR(0.09 * r.Sa * kGamma, p.D, 1e-12) << label;
+        EXPECT_NEAR(r.Sa * kWeightStar, p.V, 1e-10) << label;
+        EXPECT_NEAR(2 * std::acos(-1.0) * std::sqrt(0.009), p.Teff, 1e-10) << label;
+        EXPECT_NEAR(5.0, p.damping.value(), 1e-9) << label;
+        EXPECT_NEAR(3.0, run.R().mStar, 1e-14) << label; // S1 of the three masses
+        EXPECT_NEAR(16 * 0.2 * 10 / (4 * std::pow(std::acos(-1.0), 2)), run.R().demand.Sd.back(),
+                    1e-12);
+        EXPECT_EQ(static_cast<int>(r.method), static_cast<int>(run.R().curve.type)) << label;
+        EXPECT_EQ(PUSH_OUTCOME::Elastic, run.R().outcome.code) << label;
+        // 0.0179625 and 0.199583, 0.0179575 and 0.199528 to four digits
+        EXPECT_EQ(r.Sa == atc ? "Elastic(0.01796,  0.1996)" : "Elastic(0.01796,  0.1995)",
+                  run.dlg.PerfPointCell());
+    }
+}
+
+TEST(PushOverCurveDlg, NoPointSaysSoAndLeavesTheCellEmpty)
+{
+    T_MODEL_CONTENT c = Plastic();
+    c.model.spectra[1] = {"U", T_SPFC_USER{{0, 4}, {9, 9}, {}}}; // far above the capacity
+    T_RUN run(c, Eval(PUSH_METHOD::Atc40));
+    EXPECT_EQ(0, run.result);
+    EXPECT_FALSE(run.R().point);
+    EXPECT_TRUE(run.Said(kNoPoint));
+    EXPECT_EQ("-", run.dlg.PerfPointCell());
+    EXPECT_NE(PUSH_OUTCOME::None, run.R().outcome.code);
+    EXPECT_EQ(5U, run.R().capacity.Sd.size()); // the curve is there all the same
+}
+
+// Se(T*) = 0.45 on the long branch: dt* = 0.0405; control displacements 0.0230, 0.0576, 0.0863.
+TEST(PushOverCurveDlg, Ec8StoresTheStepsOfItsLimitStates)
+{
+    T_RUN run(Plastic(), Eval(PUSH_METHOD::Ec8Opcm));
+    ASSERT_EQ(1, run.result);
+    ASSERT_EQ(3U, run.R().limitStates.size());
+    const double factors[] = {1 / 2.5, 1.0, 1.5};
+    for (std::size_t i = 0; i < 3; ++i)
+        EXPECT_NEAR(0.0405 * kGamma * factors[i], run.R().limitStates[i].demand.value(), 1e-12);
+    EXPECT_EQ((std::vector<int>{1, 2, 3}), run.Steps(false));
+    EXPECT_EQ(std::vector<int>{}, run.Steps(true));
+    EXPECT_TRUE(run.R().messages.empty());
+    EXPECT_EQ(PUSH_OUTCOME::TargetFound, run.R().outcome.code);
+    EXPECT_EQ(10.0, run.dlg.GetGravity(1));
+
+    run.doc.Data().Assign(Plastic());
+    run.dlg.SetStoreSteps(false);
+    EXPECT_EQ(1, run.dlg.Evaluate());
+    EXPECT_EQ(std::vector<int>{}, run.Steps(false));
+}
+
+// Short branch, limited to 3 det = 3 * 0.5 * 0.09: only DL = 0.0767 lies on the curve.
+TEST(PushOverCurveDlg, StepsThatAreNotFoundAreStoredAsMinusTwo)
+{
+    T_RUN run(Plastic(), Eval(PUSH_METHOD::Ec8Opcm, "S"));
+    EXPECT_EQ(1, run.result);
+    EXPECT_TRUE(run.R().targets.at(0).capped);
+    EXPECT_NEAR(0.135 * kGamma, run.R().limitStates[1].demand.value(), 1e-12);
+    EXPECT_EQ((std::vector<int>{3, -2, -2}), run.Steps(false));
+    EXPECT_EQ(PUSH_OUTCOME::TargetBeyond, run.R().outcome.code);
+}
+
+TEST(PushOverCurveDlg, NtcUsesOneSpectrumForAllStatesAndNeverStoresSlo)
+{
+    T_RUN run(Plastic(), Eval(PUSH_METHOD::Ntc2008));
+    ASSERT_EQ(1, run.result);
+    for (const T_LIMIT_ROW& row : run.R().limitStates) {
+        EXPECT_NEAR(0.0405 * kGamma, row.demand.value(), 1e-12) << row.name;
+        EXPECT_EQ(2, row.demandStep) << row.name;
+    }
+    EXPECT_EQ((std::vector<int>{2, 2, 2}), run.Steps(true));
+    EXPECT_EQ(std::vector<int>{}, run.Steps(false));
+    // 0.03 m over 9 m is a drift of 0.0033 in every storey at the peak, step 1
+    EXPECT_NEAR(0.03, run.R().limitStates[1].capacity.value(), 1e-12);
+    EXPECT_FALSE(run.Said("IDS_QM_WARN_NO_DRIFT"));
+}
+
+TEST(PushOverCurveDlg, AStateWithoutDataIsLeftOutAndTheOthersGoOn)
+{
+    T_RUN run(Plastic(), Eval(PUSH_METHOD::Ntc2018, "N"));
+    ASSERT_EQ(1, run.result);
+    for (std::size_t i = 0; i < 4; ++i)
+        EXPECT_EQ(i == 2, run.R().limitStates[i].demand.has_value()) << i;
+    EXPECT_EQ(-2, run.Steps(true)[0]);
+    EXPECT_EQ(-2, run.Steps(true)[2]);
+
+    T_RUN none(Plastic(), Eval(PUSH_METHOD::Ntc2018, "0"));
+    EXPECT_EQ(0, none.result);
+    EXPECT_TRUE(none.Said(kNoTarget));
+    EXPECT_EQ(PUSH_OUTCOME::NoTarget, none.R().outcome.code);
+    T_RUN ec8(Plastic(), Eval(PUSH_METHOD::Ec8Opcm, "0")); // other methods use SLV
+    EXPECT_EQ(0, ec8.result);
+    T_RUN point(Plastic(), Eval(PUSH_METHOD::Atc40, "0"));
+    EXPECT_EQ(0, point.result);
+    EXPECT_TRUE(point.Said(kNoPoint));
+}
+
+// A vertical push has the load factor alone: nothing of it may be called Sd and Sa.
+TEST(PushOverCurveDlg, AVerticalPushIsTabulatedByItsLoadFactor)
+{
+    T_MODEL_CONTENT c = Plastic();
+    Vertical(c.model);
+    T_RUN run(c, Eval(PUSH_METHOD::Atc40));
+    EXPECT_EQ(PLOT_TYPE::LoadFactor, run.R().curve.type);
+    EXPECT_EQ((std::vector<double>{0.05, 0.5, 1.0, 1.5, 2.0}), run.R().curve.y);
+    EXPECT_TRUE(run.R().capacity.Sd.empty());
+}
+
+// One driver serves many evaluations: a failed one must not show the spectrum of the one before.
+TEST(PushOverCurveDlg, AFailedEvaluationKeepsNothingOfTheOneBefore)
+{
+    T_MODEL_CONTENT c = Plastic();
+    c.model.pushovers[2] = PushX("P0", 3);
+    T_RUN run(c, Eval(PUSH_METHOD::Atc40));
+    const T_ADRS_CURVE demand = run.R().demand;
+    EXPECT_FALSE(demand.Sd.empty());
+    T_EVAL_D none = Eval(PUSH_METHOD::Ec8Opcm, "S");
+    none.push = "P0"; // no results
+    ASSERT_EQ(1, run.dlg.SetEvaluation(none));
+    EXPECT_EQ(0, run.dlg.Evaluate());
+    EXPECT_TRUE(run.R().capacity.Sd.empty());
+    EXPECT_NE(demand, run.R().demand); // its own or none
+    EXPECT_TRUE(run.R().trace.empty() && !run.R().point);
+    ASSERT_EQ(1, run.dlg.SetEvaluation(Eval(PUSH_METHOD::Ec8Opcm)));
+    EXPECT_EQ(1, run.dlg.Evaluate()); // and the next one is as good as new
+    EXPECT_NEAR(0.0405 * kGamma, run.R().limitStates[1].demand.value(), 1e-12);
+}
+
+// The window shows "-" in every cell; so the rows are there, and empty.
+TEST(PushOverCurveDlg, ATargetThatCanNotBeEvaluatedKeepsItsEmptyRows)
+{
+    T_MODEL_CONTENT c = Plastic();
+    OtherMode(c.model);
+    T_RUN ec8(c, Eval(PUSH_METHOD::Ec8Opcm)), ntc(c, Eval(PUSH_METHOD::Ntc2008));
+    EXPECT_EQ(3U, ec8.R().limitStates.size());
+    EXPECT_EQ(4U, ntc.R().limitStates.size());
+}
+
+TEST(PushOverCurveDlg, EveryFailureHasItsOutcomeAndMessage)
+{
+    for (const T_FAIL_CASE& f : kFails) {
+        T_MODEL_CONTENT c = Plastic();
+        f.change(c.model);
+        T_EVAL_D eval = Eval(f.method);
+        eval.eigenFactors = f.eigen;
+        T_RUN run(c, eval);
+        EXPECT_EQ(0, run.result) << f.label;
+        EXPECT_EQ(f.outcome, run.R().outcome.code) << f.label;
+        EXPECT_TRUE(run.Said(f.key)) << f.label;
+        EXPECT_FALSE(run.R().point) << f.label;
+        EXPECT_EQ(std::vector<int>{}, run.Steps(false)) << f.label;
+        for (const auto& m : run.R().messages)
+            EXPECT_NE(m.key, m.text) << f.label; // every key has a text
+    }
+    T_MODEL_CONTENT c = Plastic();
+    c.results.clear();
+    T_RUN run(c, Eval(PUSH_METHOD::Atc40));
+    EXPECT_EQ(PUSH_OUTCOME::NoCapacity, run.R().outcome.code);
+    EXPECT_TRUE(run.Said("IDS_QM_CURVE_NOT_READ"));
+}
+
+TEST(PushOverCurveDlg, WarnsAndGoesOn)
+{
+    T_MODEL_CONTENT c = Plastic();
+    T_PUSH_DATA data;
+    data.loadFactor = {1, 2, 3, 4};
+    data.baseReaction = {10e3, 10e3, 10e3, 10e3};
+    data.displacement[3] = {0.03, 0.06, 0.05, 0.12};
+    c.results[1] = MakePushResult(data);
+    c.model.storeys.clear();
+    T_RUN run(c, Eval(PUSH_METHOD::Ntc2008));
+    EXPECT_EQ(1, run.result);
+    EXPECT_TRUE(run.Said("IDS_QM_WARN_DECREASING_DISPLACEMENT"));
+    EXPECT_TRUE(run.Said("IDS_QM_WARN_NO_DRIFT"));
+    EXPECT_EQ(1, run.R().limitStates[1].capacityStep); // the peak
+
+    c = Plastic();
+    c.model.nodes[1].mass[0] = 0.0;
+    T_EVAL_D eval = Eval(PUSH_METHOD::Ec8Opcm);
+    EXPECT_FALSE(T_RUN(c, eval).Said("IDS_RPS_ERROR_DIAPHRAGM_MASS"));
+    eval.eigenFactors = false;
+    T_RUN mass(c, eval);
+    EXPECT_TRUE(mass.Said("IDS_RPS_ERROR_DIAPHRAGM_MASS"));
+    EXPECT_EQ(1, mass.result);
+}
+
+TEST(PushOverCurveDlg, MasonryWithoutAStrengthDropSaysSo)
+{
+    T_EVAL_D eval = Eval(PUSH_METHOD::Ec8Opcm);
+    eval.masonry = true;
+    T_RUN run(Plastic(), eval);
+    EXPECT_EQ(1, run.result);
+    EXPECT_TRUE(run.Said(kNoTarget));
+    ASSERT_EQ(4U, run.R().limitStates.size());
+    EXPECT_NEAR(0.12, run.R().limitStates[1].capacity.value(), 1e-12); // the last step
+    EXPECT_NEAR(0.09, run.R().limitStates[3].capacity.value(), 1e-12); // 3 dy
+}
+
+// Third storey, node 2 below at 0.01 and 0.02; heavy node 6 ahead of node 3. Peak is step 2.
+// Means: (0.03 + 0.038)/2 - 0.02 = 0.014 over 3 m, within 0.005: the peak step.
+// By mass: (0.03 + 9*0.038)/10 - 0.02 = 0.0172, 0.00573; step 1 (0.015 + 9*0.024)/10 - 0.01
+// = 0.0131, 0.00437, which is nearer to 0.005.
+TEST(PushOverCurveDlg, DriftKindsLeadToDifferentSteps)
+{
+    T_MODEL_CONTENT c = Plastic();
+    c.model.nodes[6] = {6, {1, 0, -9}, {9000, 0, 0}, {}};
+    c.model.storeys[3].nodes = {3, 6};
+    c.model.modes[2].shape[6] = c.model.modes[2].shape[3];
+    T_PUSH_DATA data;
+    data.loadFactor = {1, 2, 3};
+    data.baseReaction = {5e3, 10e3, 10e3};
+    data.displacement = {{1, {0.005, 0.01, 0.02}},
+                         {2, {0.01, 0.02, 0.04}},
+                         {3, {0.015, 0.03, 0.06}},
+                         {6, {0.024, 0.038, 0.06}}};
+    c.results[1] = MakePushResult(data);
+    T_EVAL_D eval = Eval(PUSH_METHOD::Ntc2008);
+    EXPECT_EQ(2, T_RUN(c, eval).R().limitStates[1].capacityStep); // kind 1 is the default
+    eval.driftKind = 2;
+    EXPECT_EQ(1, T_RUN(c, eval).R().limitStates[1].capacityStep);
+    EXPECT_TRUE(CAppBase::TakeAssertions_ST().empty());
+    eval.driftKind = 3;
+    T_RUN run(c, eval);
+    EXPECT_FALSE(run.R().limitStates[1].capacity);
+    EXPECT_TRUE(run.R().limitStates[1].demand);
+    EXPECT_FALSE(CAppBase::TakeAssertions_ST().empty());
+}
+
+TEST(PushOverCurveDlg, SettingsAreRefusedAndKept)
+{
+    CDBDoc doc;
+    doc.Data().Assign(Plastic());
+    CPushOverCurveDlg dlg(doc);
+    ASSERT_EQ(1, dlg.SetEvaluation(Eval(PUSH_METHOD::Ec8Opcm)));
+    T_EVAL_D bad = Eval(PUSH_METHOD::Atc40);
+    bad.push = "PY";
+    EXPECT_EQ(0, dlg.SetEvaluation(bad));
+    EXPECT_NE(std::string::npos, dlg.SettingsError().find("PY"));
+    bad = Eval(PUSH_METHOD::Atc40, "none");
+    EXPECT_EQ(0, dlg.SetEvaluation(bad));
+    EXPECT_NE(std::string::npos, dlg.SettingsError().find("none"));
+    for (const double v : {0.0, -0.1, 1.0000001, std::numeric_limits<double>::quiet_NaN()}) {
+        for (const bool secant : {true, false}) {
+            bad = Eval(PUSH_METHOD::Atc40);
+            bad.bilinear = T_EVAL_BILINEAR{};
+            (secant ? bad.bilinear->secant : bad.bilinear->drop) = v;
+            dlg.ClearMessages();
+            EXPECT_EQ(0, dlg.SetEvaluation(bad)) << v;
+            EXPECT_EQ("IDS_DB_PO_CURVE_PP_BETWEEN_0_1", dlg.Messages().at(0).key) << v;
+        }
+    }
+    EXPECT_EQ(1, dlg.Evaluate()); // still the first settings
+    EXPECT_EQ(PUSH_METHOD::Ec8Opcm, dlg.Result().eval.method);
+    T_EVAL_D good = Eval(PUSH_METHOD::Ntc2008);
+    good.bilinear = T_EVAL_BILINEAR{{}, 1.0, 1.0, {}};
+    EXPECT_EQ(1, dlg.SetEvaluation(good));
+}
+
+TEST(PushOverCurveDlg, GravityOfSpectrumThenModelThenStandard)
+{
+    T_MODEL_CONTENT c = Plastic();
+    c.model.styp.units = {FORCE_UNIT::N, LENGTH_UNIT::mm};
+    std::get<T_SPFC_USER>(c.model.spectra[1].data).gravity = 9.0;
+    CDBDoc doc;
+    doc.Data().Assign(c);
+    CPushOverCurveDlg dlg(doc);
+    ASSERT_EQ(1, dlg.SetEvaluation(Eval(PUSH_METHOD::Ec8Opcm)));
+    EXPECT_DOUBLE_EQ(9000.0, dlg.GetGravity(1));
+    EXPECT_DOUBLE_EQ(10000.0, dlg.GetGravity(0));
+    ASSERT_EQ(1, dlg.Evaluate());
+    EXPECT_DOUBLE_EQ(9000.0, dlg.Result().factors.gravity);
+    // It serves the curve too: a smaller gravity gives a larger Sa, 10 kN / (5 * 9 * alpha).
+    EXPECT_NEAR(10.0 / 9.0 * 10.0 / kWeightStar, dlg.Result().capacity.Sa[1], 1e-14);
+    EXPECT_NEAR(30.0 / kGamma, dlg.Result().capacity.Sd[1], 1e-12);
+
+    ASSERT_EQ(1, dlg.SetEvaluation(Eval(PUSH_METHOD::Ec8Opcm, "S")));
+    EXPECT_DOUBLE_EQ(10000.0, dlg.GetGravity(1));
+    c.model.styp.gravity.reset();
+    doc.Data().Assign(c);
+    EXPECT_DOUBLE_EQ(9806.65, dlg.GetGravity(1));
+}
+
+TEST(PushOverCurveDlg, ThePlottedCurveMayBeOfAnotherType)
+{
+    T_EVAL_D eval = Eval(PUSH_METHOD::Ec8Opcm);
+    eval.plotType = 2;
+    T_RUN run(Plastic(), eval);
+    ASSERT_EQ(1, run.result);
+    EXPECT_EQ(PLOT_TYPE::Drift, run.R().curve.type);
+    EXPECT_DOUBLE_EQ(0.03 / 9, run.R().curve.x.at(1));
+    EXPECT_DOUBLE_EQ(0.2, run.R().curve.y.at(1));
+    EXPECT_NEAR(0.03 / kGamma, run.R().capacity.Sd.at(1), 1e-15); // the evaluation keeps its own
+    double D = 0.1, V = 0.1;
+    run.dlg.TransferToDispAndReac(&D, &V);
+    EXPECT_DOUBLE_EQ(0.1 * kGamma, D);
+    EXPECT_DOUBLE_EQ(0.1 * kWeightStar, V);
+}
+
+TEST(PushOverCurveDlg, WrongProcedureNumbersAndTheObsoleteQueryAssert)
+{
+    CDBDoc doc;
+    CPushOverCurveDlg dlg(doc);
+    CAppBase::TakeAssertions_ST();
+    const auto isNull = [&](PUSH_METHOD method, int procedure) {
+        return MakePerfPtCalculator(method, procedure, dlg) == nullptr;
+    };
+    for (const int ok : {0, 1})
+        EXPECT_FALSE(isNull(PUSH_METHOD::Atc40, ok) || isNull(PUSH_METHOD::Fema440, ok));
+    EXPECT_FALSE(isNull(PUSH_METHOD::Fema440, 2));
+    EXPECT_TRUE(CAppBase::TakeAssertions_ST().empty());
+    EXPECT_TRUE(isNull(PUSH_METHOD::Atc40, 2) && isNull(PUSH_METHOD::Fema440, 3) &&
+                isNull(PUSH_METHOD::Fema440, -1) && isNull(PUSH_METHOD::Ec8Opcm, 0));
+    EXPECT_EQ(0, dlg.ExistEC8());
+    const std::vector<T_ASSERTION> raised = CAppBase::TakeAssertions_ST();
+    ASSERT_EQ(5U, raised.size());
+    for (const T_ASSERTION& a : raised)
+        EXPECT_EQ("src/qm_rps/pushovercurvedlg", a.source);
+}
+
+TEST(PushOverCurveDlg, AWrongProcedureEndsWithoutAPoint)
+{
+    T_EVAL_D eval = Eval(PUSH_METHOD::Atc40);
+    eval.procedure = 'C';
+    T_RUN run(Plastic(), eval);
+    EXPECT_EQ(0, run.result);
+    EXPECT_TRUE(run.Said(kNoPoint));
+    EXPECT_EQ(1U, CAppBase::TakeAssertions_ST().size());
+}
