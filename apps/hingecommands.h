@@ -1,0 +1,31 @@
+// The commands on hinge types and pushover load cases.
+#pragma once
+
+#include "exitcodes.h"
+
+#include <string>
+#include <vector>
+
+struct T_HINGE_OPTIONS {
+    std::string file;
+    std::string type;                        // name of a hinge type; empty: all
+    std::string component;                   // "Fx" to "Mz"
+    std::string end;                         // "I" or "J"; empty: the first page
+    std::string to;                          // "ddy" or "plastic"
+    std::string out;                         // file to write: .json, .qmdb or a picture
+    bool interaction = false;                // plot: interaction instead of the backbone
+    std::vector<double> add, remove, change; // axial forces; change: old and new
+};
+
+EXIT_CODE RunHingeList(const T_HINGE_OPTIONS& options);
+EXIT_CODE RunHingeShow(const T_HINGE_OPTIONS& options);
+/// Every rule that is not kept, with type, component, end and point. NotFound when there is any.
+EXIT_CODE RunHingeCheck(const T_HINGE_OPTIONS& options);
+/// Yield strengths, rotations and deformations from section, material and member length.
+EXIT_CODE RunHingeYield(const T_HINGE_OPTIONS& options);
+EXIT_CODE RunHingeConvert(const T_HINGE_OPTIONS& options);
+EXIT_CODE RunHingeAxial(const T_HINGE_OPTIONS& options);
+EXIT_CODE RunHingePlot(const T_HINGE_OPTIONS& options);
+
+/// Checks the pushover load cases and their pattern rows.
+EXIT_CODE RunCaseCheck(const std::string& file);
