@@ -168,11 +168,12 @@ EXIT_CODE StoreType(CDBDoc& doc, int key, const T_PHGT_D& type, const std::strin
     return WriteDoc(doc, out);
 }
 
-/// The type of that name with its key.
-EXIT_CODE TheType(CDBDoc& doc, const std::string& name, int& key, T_PHGT_D& type)
+/// Opens the document and takes the type of that name with its key.
+EXIT_CODE OpenType(CDBDoc& doc, const T_HINGE_OPTIONS& o, int& key, T_PHGT_D& type)
 {
-    if (doc.Attr().FindPhgt(name, key) && doc.Attr().GetPhgt(key, type)) return EXIT_CODE::Done;
-    return Complain(EXIT_CODE::Usage, doc.Path() + ": no hinge type named \"" + name + "\"");
+    if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
+    if (doc.Attr().FindPhgt(o.type, key) && doc.Attr().GetPhgt(key, type)) return EXIT_CODE::Done;
+    return Complain(EXIT_CODE::Usage, doc.Path() + ": no hinge type named \"" + o.type + "\"");
 }
 
 /// True where both sides of every curve have a yield deformation to convert with.
@@ -321,11 +322,9 @@ EXIT_CODE RunHingeYield(const T_HINGE_OPTIONS& o)
 EXIT_CODE RunHingeConvert(const T_HINGE_OPTIONS& o)
 {
     CDBDoc doc;
-    if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     int key = 0;
     T_PHGT_D type;
-    if (const EXIT_CODE code = TheType(doc, o.type, key, type); code != EXIT_CODE::Done)
-        return code;
+    if (const EXIT_CODE code = OpenType(doc, o, key, type); code != EXIT_CODE::Done) return code;
     const SKEL_MEASURE to = o.to == "plastic" ? SKEL_MEASURE::Plastic : SKEL_MEASURE::DDy;
     int switched = 0;
     bool noYield = false; // a switch without a yield deformation would make every value 0
@@ -353,11 +352,9 @@ EXIT_CODE RunHingeConvert(const T_HINGE_OPTIONS& o)
 EXIT_CODE RunHingeAxial(const T_HINGE_OPTIONS& o)
 {
     CDBDoc doc;
-    if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     int key = 0;
     T_PHGT_D type;
-    if (const EXIT_CODE code = TheType(doc, o.type, key, type); code != EXIT_CODE::Done)
-        return code;
+    if (const EXIT_CODE code = OpenType(doc, o, key, type); code != EXIT_CODE::Done) return code;
     const auto component = ComponentOf(o.component);
     HINGE_END page{};
     T_SKEL_CURVE* curve =
@@ -382,11 +379,9 @@ EXIT_CODE RunHingeAxial(const T_HINGE_OPTIONS& o)
 EXIT_CODE RunHingePlot(const T_HINGE_OPTIONS& o)
 {
     CDBDoc doc;
-    if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     int key = 0;
     T_PHGT_D type;
-    if (const EXIT_CODE code = TheType(doc, o.type, key, type); code != EXIT_CODE::Done)
-        return code;
+    if (const EXIT_CODE code = OpenType(doc, o, key, type); code != EXIT_CODE::Done) return code;
 #ifdef QM_UI
     T_PLOT plot;
     if (o.interaction) {

@@ -1,5 +1,7 @@
 #include "qm_rps/po_hingeskcvtabdlg.h"
 
+#include "qm_rps/hingemirror.h"
+
 #include "qm_db/compfunc.h"
 
 #include <cmath>
@@ -169,15 +171,6 @@ bool IsMultilinear(SKEL_TYPE t)
     return t != SKEL_TYPE::Fema && t != SKEL_TYPE::Ec8;
 }
 
-void MirrorCurve(T_SKEL_CURVE& curve)
-{
-    T_SKEL_MULTI* m = std::get_if<T_SKEL_MULTI>(&curve);
-    if (!m || !m->symmetric) return;
-    const double gap = m->sides.neg.gap; // a gap has its own entry on each side
-    m->sides.neg = m->sides.pos;
-    m->sides.neg.gap = gap;
-}
-
 } // namespace
 
 int CPO_HingeSkcvTabDlg::Data2Dlg(HINGE_COMPONENT c, const T_HINGE_COMPONENT& data)
@@ -193,11 +186,7 @@ int CPO_HingeSkcvTabDlg::Data2Dlg(HINGE_COMPONENT c, const T_HINGE_COMPONENT& da
 int CPO_HingeSkcvTabDlg::Dlg2Data(T_HINGE_COMPONENT& data)
 {
     if (!CheckData()) return 0;
-    T_HINGE_COMPONENT result = m_data;
-    MirrorCurve(result.curves.I);
-    MirrorCurve(result.curves.J);
-    if (result.sameEnds) result.curves.J = result.curves.I;
-    data = std::move(result);
+    data = MirroredComponent(m_data);
     return 1;
 }
 
@@ -209,11 +198,7 @@ T_SKEL_MULTI* CPO_HingeSkcvTabDlg::Curve(HINGE_END end)
 
 std::vector<const char*> CPO_HingeSkcvTabDlg::PageTitles() const
 {
-    std::vector<const char*> titles;
-    ForEachPage(m_data, [&](HINGE_END end, const T_SKEL_CURVE&) {
-        titles.push_back(PageTitleKey(m_data, end));
-    });
-    return titles;
+    return PageTitleKeys(m_data);
 }
 
 void CPO_HingeSkcvTabDlg::SetDefaultAlpha(HINGE_END end, const T_SIDES<double>& alpha1,

@@ -1,5 +1,6 @@
 #include "qm_rps/po_hingeskcvtabeurodlg.h"
 
+#include "qm_rps/hingemirror.h"
 #include "qm_rps/hingesiderules.h"
 
 namespace {
@@ -16,12 +17,6 @@ const T_RULE<B> kStiffness[] = {
 };
 // clang-format on
 
-void MirrorCurve(T_SKEL_CURVE& curve)
-{
-    T_SKEL_EC8* e = std::get_if<T_SKEL_EC8>(&curve);
-    if (e && e->symmetric) MirrorSide(e->sides.pos, e->sides.neg);
-}
-
 } // namespace
 
 int CPO_HingeSkcvTabEuroDlg::Data2Dlg(HINGE_COMPONENT c, const T_HINGE_COMPONENT& data)
@@ -37,11 +32,7 @@ int CPO_HingeSkcvTabEuroDlg::Data2Dlg(HINGE_COMPONENT c, const T_HINGE_COMPONENT
 int CPO_HingeSkcvTabEuroDlg::Dlg2Data(T_HINGE_COMPONENT& data)
 {
     if (!CheckData()) return 0;
-    T_HINGE_COMPONENT result = m_data;
-    MirrorCurve(result.curves.I);
-    MirrorCurve(result.curves.J);
-    if (result.sameEnds) result.curves.J = result.curves.I;
-    data = std::move(result);
+    data = MirroredComponent(m_data);
     return 1;
 }
 
@@ -53,11 +44,7 @@ T_SKEL_EC8* CPO_HingeSkcvTabEuroDlg::Curve(HINGE_END end)
 
 std::vector<const char*> CPO_HingeSkcvTabEuroDlg::PageTitles() const
 {
-    std::vector<const char*> titles;
-    ForEachPage(m_data, [&](HINGE_END end, const T_SKEL_CURVE&) {
-        titles.push_back(PageTitleKey(m_data, end));
-    });
-    return titles;
+    return PageTitleKeys(m_data);
 }
 
 bool CPO_HingeSkcvTabEuroDlg::IsEurocodePair(const std::string& concreteCode,

@@ -3,6 +3,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/hingemeasure.h"
+#include "qm_rps/hingemirror.h"
 #include "qm_rps/hingesiderules.h"
 #include "qm_rps/po_hingefemaenrgdsptgrid.h"
 #include "qm_rps/po_hingeskcvtabfemaaxialgrid.h"
@@ -130,15 +131,6 @@ const T_SKEL_AXIAL* CurveOfForce(const T_SKEL_FEMA& f, double axial)
     return nullptr;
 }
 
-void MirrorCurve(T_SKEL_CURVE& curve)
-{
-    T_SKEL_FEMA* f = std::get_if<T_SKEL_FEMA>(&curve);
-    if (!f || !f->symmetric) return;
-    MirrorSide(f->sides.pos, f->sides.neg);
-    for (T_SKEL_AXIAL& c : f->curves)
-        MirrorSide(c.sides.pos, c.sides.neg);
-}
-
 } // namespace
 
 int CPO_HingeSkcvTabFemaDlg::Data2Dlg(HINGE_COMPONENT c, const T_HINGE_COMPONENT& data)
@@ -154,11 +146,7 @@ int CPO_HingeSkcvTabFemaDlg::Data2Dlg(HINGE_COMPONENT c, const T_HINGE_COMPONENT
 int CPO_HingeSkcvTabFemaDlg::Dlg2Data(HINGE_COMPONENT c, T_HINGE_COMPONENT& data)
 {
     if (!Component(c) || !CheckData()) return 0;
-    T_HINGE_COMPONENT result = *Component(c);
-    MirrorCurve(result.curves.I);
-    MirrorCurve(result.curves.J);
-    if (result.sameEnds) result.curves.J = result.curves.I;
-    data = std::move(result);
+    data = MirroredComponent(*Component(c));
     return 1;
 }
 
@@ -283,12 +271,8 @@ bool CPO_HingeSkcvTabFemaDlg::IsNeedIJTab(HINGE_COMPONENT c) const
 
 std::vector<const char*> CPO_HingeSkcvTabFemaDlg::PageTitles(HINGE_COMPONENT c) const
 {
-    std::vector<const char*> titles;
-    if (!m_components[Index(c)]) return titles;
-    ForEachPage(*m_components[Index(c)], [&](HINGE_END end, const T_SKEL_CURVE&) {
-        titles.push_back(PageTitleKey(*m_components[Index(c)], end));
-    });
-    return titles;
+    const auto& component = m_components[Index(c)];
+    return component ? PageTitleKeys(*component) : std::vector<const char*>{};
 }
 
 void CPO_HingeSkcvTabFemaDlg::SetAutoCalcValue(HINGE_COMPONENT c, HINGE_END end,

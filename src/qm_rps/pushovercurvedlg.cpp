@@ -75,6 +75,7 @@ int CPushOverCurveDlg::SetEvaluation(const T_EVAL_D& evaluation)
     }
     m_settingsError.clear();
     m_eval = evaluation;
+    m_eval.masonry = evaluation.masonry.value_or(ExistEC8OrMasonry());
     m_spectrumRecord = record;
     m_pushover = pushover;
     T_DAMP_PARAM damping;
@@ -438,6 +439,12 @@ std::string CPushOverCurveDlg::PerfPointCell() const
     if (!m_result.point) return "-";
     const std::string cell = FormatText("%6.4g,  %6.4g", m_result.point->Sd, m_result.point->Sa);
     return m_result.result == kPerfPtElastic ? "Elastic(" + cell + ")" : cell;
+}
+
+bool CPushOverCurveDlg::ExistEC8OrMasonry() const
+{
+    const auto isMasonry = [](const auto& entry) { return entry.second.masonry.has_value(); };
+    return std::ranges::any_of(m_doc.Data().Model().hingeTypes, isMasonry);
 }
 
 int CPushOverCurveDlg::ExistEC8() const

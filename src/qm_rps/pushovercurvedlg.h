@@ -60,6 +60,10 @@ public:
     /// The cells of the performance point: "%6.4g,  %6.4g", "Elastic(...)" for an elastic point.
     std::string PerfPointCell() const;
 
+    /// True when a hinge type of the model carries the masonry flag: evaluations that don't say
+    /// otherwise are then evaluated as masonry.
+    bool ExistEC8OrMasonry() const;
+
     /// Obsolete; asserts and returns 0, on purpose.
     int ExistEC8() const;
 

@@ -407,8 +407,8 @@ DAMPING = {  # FEMA 440 table 6-1: A, B, C, D, E, F
 
 
 class PerformancePoint:
-    def __init__(self, curve, spec, ev):
-        self.c, self.spec, self.g = curve, spec, curve.g
+    def __init__(self, curve, spectrum, ev):
+        self.c, self.spectrum, self.g = curve, spectrum, curve.g
         self.behavior = ev.get("behavior", 0)
         self.elastic = ev.get("elastic_damping", 5.0)
         self.user = ev.get("user_damping", [0.0] * 4)
@@ -416,8 +416,8 @@ class PerformancePoint:
         self.Sd, self.Sa = curve.Sd, curve.Sa
         if self.Sd[1] == 0.0 or self.Sa[1] == 0.0:
             raise Fail("first step without displacement or force")
-        self.sa5 = [spec.at(t) for t in spec.T]
-        self.sd5 = to_adrs(spec.T, self.sa5, self.g)
+        self.sa5 = [spectrum.at(t) for t in spectrum.T]
+        self.sd5 = to_adrs(spectrum.T, self.sa5, self.g)
         self.trials = 0
         self.by_rounding = False  # the answer hangs on the last bits: see README
 
@@ -528,8 +528,8 @@ class PerformancePoint:
             if abs(ap * dp) < 1e-30:
                 raise Fail("trial point too small")
             sra, srv, beta = self.reduction(dy, ay, dp, ap)
-            sa = self.spec.reduced(sra, srv, self.behavior)
-            hit = self.crossing_with(to_adrs(self.spec.T, sa, self.g), sa)
+            sa = self.spectrum.reduced(sra, srv, self.behavior)
+            hit = self.crossing_with(to_adrs(self.spectrum.T, sa, self.g), sa)
             if not hit:
                 raise Fail("no crossing with the reduced demand")
             if 0.95 * dp <= hit[0] <= 1.05 * dp:
@@ -582,9 +582,9 @@ class PerformancePoint:
             alpha = div(div(a, ay) - 1.0, div(d, dy) - 1.0)
             teff = t0 * root(div(mu, alpha * mu + 1.0 - alpha))
             sra, srv, beta = self.reduction(dy, ay, d, a)
-            sa = self.spec.reduced(sra, srv, self.behavior)
+            sa = self.spectrum.reduced(sra, srv, self.behavior)
             hit = radial_crossing(1.0, div(4.0 * PI * PI, teff * teff * self.g),
-                                  to_adrs(self.spec.T, sa, self.g), sa)
+                                  to_adrs(self.spectrum.T, sa, self.g), sa)
             if hit:
                 trace.append(hit)
                 betas.append(beta)
@@ -643,7 +643,7 @@ class PerformancePoint:
         if b == 0.0:
             raise Fail("spectral reduction is zero")
         sa = [a / b for a in self.sa5]
-        return to_adrs(self.spec.T, sa, self.g), sa
+        return to_adrs(self.spectrum.T, sa, self.g), sa
 
     def b_factor(self, beta):
         return div(4.0, 5.6 - log(beta))
@@ -788,27 +788,27 @@ class Target:
 
     # -- displacements
 
-    def target(self, spec, cap):
+    def target(self, spectrum, cap):
         """Elastic and inelastic SDOF target displacement; qu is None for long periods."""
         t = self.tstar
-        se = spec.at(t)
+        se = spectrum.at(t)
         det = se * self.g * (t / (2.0 * PI)) ** 2
-        if t >= spec.tc:
+        if t >= spectrum.tc:
             return se, det, det, None
         if t == 0.0:
             raise Fail("T* is zero")
         qu = se * (1.0 / self.ay)
         if qu == 0.0:
             raise Fail("qu is zero")
-        dt = det if qu <= 1.0 else (det / qu) * (1.0 + (qu - 1.0) * spec.tc / t)
+        dt = det if qu <= 1.0 else (det / qu) * (1.0 + (qu - 1.0) * spectrum.tc / t)
         if det > dt:
             raise Fail("inelastic below elastic displacement")
         if cap and dt > 3.0 * det:
             dt = 3.0 * det
         return se, det, dt, qu
 
-    def record(self, spec, se, det, dt, qu):
-        return {"T_star": self.tstar, "Tc": spec.tc, "Se": se, "ay": self.ay, "dy": self.dy,
+    def record(self, spectrum, se, det, dt, qu):
+        return {"T_star": self.tstar, "Tc": spectrum.tc, "Se": se, "ay": self.ay, "dy": self.dy,
                 "Fy": self.ay * self.g * self.mstar, "m_star": self.mstar, "det": det,
                 "dt": dt, "qu": qu}
 
@@ -844,12 +844,12 @@ class Target:
     # -- EN 1998-1 Annex B
 
     def ec8(self):
-        spec = Spectrum(self.rec)
+        spectrum = Spectrum(self.rec)
         if self.rule == "ec8":
             dm = self.bilinear_peak()
             if self.iterate:
                 for _ in range(50):
-                    new = min(self.target(spec, True)[2], self.xs[-1])
+                    new = min(self.target(spectrum, True)[2], self.xs[-1])
                     if abs(new - dm) < 1e-6 * abs(new):
                         break
                     dm = new
@@ -859,8 +859,8 @@ class Target:
         rows = [blank(n) for n in ("DL", "SD", "NC")]
         out, why = None, "target found"
         try:
-            se, det, dt, qu = self.target(spec, True)
-            out = self.record(spec, se, det, dt, qu)
+            se, det, dt, qu = self.target(spectrum, True)
+            out = self.record(spectrum, se, det, dt, qu)
             for row, t in zip(rows, (dt / 2.5, dt, dt * 1.5)):
                 row["demand"] = self.gamma * t
                 row["demand_step"] = found(self.nearest(t, -2))
@@ -868,10 +868,10 @@ class Target:
             why = str(e)
         if self.masonry:
             rows.append(blank("q*=3"))
-            self.masonry_capacity(rows, spec)
+            self.masonry_capacity(rows, spectrum)
         return out, rows, out is not None, why
 
-    def masonry_capacity(self, rows, spec):
+    def masonry_capacity(self, rows, spectrum):
         d, V, last = self.d, self.V, len(self.d) - 1
         peak = self.peak()
         dl_step = self.drift_step(0.003)
@@ -894,8 +894,8 @@ class Target:
         if self.tstar != 0.0:
             elastic = self.ay * self.g * (self.tstar / (2.0 * PI)) ** 2 * q
             dq = elastic
-            if self.tstar < spec.tc:
-                dq = (elastic / q) * (1.0 + (q - 1.0) * spec.tc / self.tstar)
+            if self.tstar < spectrum.tc:
+                dq = (elastic / q) * (1.0 + (q - 1.0) * spectrum.tc / self.tstar)
             dq_step = self.nearest(dq, last)
         caps = ((dl, dl_step), (sd, sd_step), None, (dq, dq_step))
         for row, cap in zip(rows, caps):
@@ -921,13 +921,13 @@ class Target:
             out.append(entry)
             if self.rec["kind"] == "ntc" and state not in self.rec["limit_states"]:
                 continue
-            spec = Spectrum(self.rec, state)
+            spectrum = Spectrum(self.rec, state)
             try:
-                se, det, dt, qu = self.target(spec, False)
+                se, det, dt, qu = self.target(spectrum, False)
             except Fail:
                 continue
             any_found = True
-            entry.update(self.record(spec, se, det, dt, qu))
+            entry.update(self.record(spectrum, se, det, dt, qu))
             row["demand"] = self.gamma * dt
             row["demand_step"] = found(self.nearest(dt, -2))
         self.ntc_capacity(rows, new)

@@ -1,0 +1,8 @@
+// What an editor of skeleton curves hands back: symmetric sides mirrored, equal ends copied.
+#pragma once
+
+#include "qm_db/hingerecords.h"
+
+/// The component with the negative side of every symmetric curve made from the positive one (a gap
+/// keeps its own entry on each side), and the J-end's curve made the I-end's where both are alike.
+T_HINGE_COMPONENT MirroredComponent(T_HINGE_COMPONENT component);
