@@ -51,7 +51,7 @@ bool AddExtras(CPushOverCurveDlg& driver, const T_EVALUATE_OPTIONS& options)
         if (!driver.OnPushoverCurveAddStep(step)) return refused("step " + std::to_string(step));
     }
     for (const std::string& spectrum : options.spectra) {
-        if (!driver.Result().IsTarget() && !driver.CalcAdditionalPerformancePoint(spectrum))
+        if (!driver.CalcAdditionalPerformancePoint(spectrum))
             return refused("spectrum \"" + spectrum + "\"");
     }
     return true;
@@ -83,8 +83,8 @@ EXIT_CODE EvaluateAll(CDBDoc& doc, const T_EVALUATE_OPTIONS& options,
 EXIT_CODE WriteOutput(const std::string& path, const std::string& text)
 {
     if (path == "-") {
-        std::fwrite(text.data(), 1, text.size(), stdout);
-        return std::fflush(stdout) == 0
+        const bool whole = std::fwrite(text.data(), 1, text.size(), stdout) == text.size();
+        return whole && std::fflush(stdout) == 0
                    ? EXIT_CODE::Done
                    : Complain(EXIT_CODE::NoAccess, "standard output can't be written");
     }

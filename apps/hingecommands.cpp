@@ -3,6 +3,7 @@
 #include "inputfile.h"
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/hingemirror.h"
 #include "qm_rps/hingetheta.h"
 #include "qm_rps/po_hingeskcvtabfemaaxialgrid.h"
 #include "qm_rps/po_hingeskcvtabfemadlg.h"
@@ -21,6 +22,7 @@
 #include <algorithm>
 #include <cmath>
 #include <cstdio>
+#include <tuple>
 
 namespace {
 
@@ -54,7 +56,8 @@ T_HINGE_CONTEXT ContextOf(CDBDoc& doc)
         };
         if (type.yieldSurface) {
             T_YIELD_SURFACE surface = *type.yieldSurface;
-            const SKEL_TYPE curve = type.components[4].type; // My leads the surface
+            const auto& [my, mz] = std::tie(type.components[4], type.components[5]);
+            const SKEL_TYPE curve = my.active ? my.type : mz.type; // My leads the surface
             add(CPO_HingeYieldPropDlgNew(surface, curve).Findings());
         }
         if (type.pmm) {
@@ -161,8 +164,10 @@ EXIT_CODE WriteDoc(CDBDoc& doc, const std::string& path)
 }
 
 /// Puts a changed type back as one undoable step.
-EXIT_CODE StoreType(CDBDoc& doc, int key, const T_PHGT_D& type, const std::string& out)
+EXIT_CODE StoreType(CDBDoc& doc, int key, T_PHGT_D& type, const std::string& out)
 {
+    for (T_HINGE_COMPONENT& component : type.components)
+        component = MirroredComponent(component);
     if (!doc.Edit().Begin("hinge type") || !doc.Edit().Put(key, type) || !doc.Edit().Commit())
         return Complain(EXIT_CODE::BadInput, doc.Path() + ": the hinge type can't be stored");
     return WriteDoc(doc, out);
@@ -176,15 +181,16 @@ EXIT_CODE OpenType(CDBDoc& doc, const T_HINGE_OPTIONS& o, int& key, T_PHGT_D& ty
     return Complain(EXIT_CODE::Usage, doc.Path() + ": no hinge type named \"" + o.type + "\"");
 }
 
-/// True where both sides of every curve have a yield deformation to convert with.
+/// True where every side that the curve uses has a yield deformation to convert with.
 bool HasYieldDeform(const T_SKEL_FEMA& curve)
 {
     constexpr double kNone = 1e-7;
-    const auto has = [](const T_SIDES<T_SKEL_SIDE>& s) {
-        return std::fabs(s.pos.yieldDeform) >= kNone && std::fabs(s.neg.yieldDeform) >= kNone;
+    const auto has = [&](const T_SIDES<T_SKEL_SIDE>& s) {
+        return std::fabs(s.pos.yieldDeform) >= kNone &&
+               (curve.symmetric || std::fabs(s.neg.yieldDeform) >= kNone);
     };
-    return has(curve.sides) &&
-           std::ranges::all_of(curve.curves, [&](const T_SKEL_AXIAL& a) { return has(a.sides); });
+    if (!curve.multiCurve) return has(curve.sides);
+    return std::ranges::all_of(curve.curves, [&](const T_SKEL_AXIAL& a) { return has(a.sides); });
 }
 
 /// The curve of the page that the options name, or null.
@@ -255,52 +261,96 @@ EXIT_CODE RunHingeCheck(const T_HINGE_OPTIONS& o)
 
 namespace {
 
-/// Yield strengths and deformations of the components of a hinge on one element.
-void PrintYield(CDBDoc& doc, const T_PHGE_D& hinge, T_PHGT_D& type)
-{
+/// What the look-ups and the strength calculation gave for one element.
+struct T_YIELD_INPUT {
     T_SECT_D section;
     T_MATL_D material;
     double length = 0.0;
-    if (!doc.Attr().GetSectMatlByElem(hinge.element, section, material) ||
-        !doc.Memb().GetMembLengByIncludeElem(hinge.element, length)) {
-        std::printf("element %d: section, material or member is missing\n", hinge.element);
-        return;
-    }
+    bool known = false; // automatic strengths could be calculated
     T_SECTION_STRENGTH strength;
     SECT_FAULT fault{};
-    const int known = CSectionStrength::Calc(section, material, strength, fault);
-    std::printf("element %d, hinge type %s, section %s, material %s, member length %.6g\n",
-                hinge.element, type.name.c_str(), section.name.c_str(), material.name.c_str(),
-                length);
-    for (std::size_t c = 0; c < type.components.size(); ++c) {
-        T_HINGE_COMPONENT& component = type.components[c];
-        if (!component.active) continue;
-        const auto k = static_cast<HINGE_COMPONENT>(c);
-        ForEachPage(component, [&](HINGE_END end, const T_SKEL_CURVE& curve) {
-            const auto at = end == HINGE_END::J ? HINGE_LOCATION::JEnd : HINGE_LOCATION::IEnd;
-            const T_THETA_LOOKUP lookup{&section, &material, length};
-            std::visit(
-                [&](const auto& s) {
-                    const auto& side = s.sides.pos;
-                    const auto automatic = known ? strength.yield[c] : std::nullopt;
-                    double yield = automatic ? automatic->pos : 0.0;
-                    if constexpr (requires { side.yield; }) {
-                        if (!s.autoYield) yield = side.yield;
-                    } else if (!s.autoYield) {
-                        yield = side.P1;
-                    }
-                    const double moment = CHingeTheta::CalcThetaMoment(
-                        lookup, k, at, s.initStiffness, side.userStiffness, yield);
-                    const double shear = CHingeTheta::CalcThetaShear(lookup, k, at, s.initStiffness,
-                                                                     side.userStiffness, yield);
-                    std::printf("  %s %s: yield strength %.9g (%s), yield deformation %.9g\n",
-                                kComponentNames[c], EndName(end), yield,
-                                s.autoYield ? "automatic" : "entered",
-                                IsMoment(static_cast<int>(c)) ? moment : shear);
-                },
-                curve);
-        });
+};
+
+/// Entered yield strength of one side; P2 of a trilinear curve, whose P1 is the crack strength.
+double EnteredYield(const T_SKEL_SIDE& side, SKEL_TYPE)
+{
+    return side.yield;
+}
+double EnteredYield(const T_SKEL_MULTI_SIDE& side, SKEL_TYPE type)
+{
+    const bool trilinear = type == SKEL_TYPE::Trilinear || type == SKEL_TYPE::SlipTrilinear;
+    return trilinear ? side.P2 : side.P1;
+}
+
+/// One side at one end: strength and deformation at first yield, "-" where there is no method.
+/// False when an automatic strength could not be calculated.
+template <class CURVE, class SIDE>
+bool PrintYieldSide(const T_YIELD_INPUT& in, std::size_t c, SKEL_TYPE type, HINGE_LOCATION end,
+                    const CURVE& curve, const SIDE& side, bool positive)
+{
+    const auto automatic = in.known ? in.strength.yield[c] : std::nullopt;
+    std::optional<double> yield;
+    if (!curve.autoYield)
+        yield = EnteredYield(side, type);
+    else if (automatic)
+        yield = positive ? automatic->pos : automatic->neg;
+    const auto k = static_cast<HINGE_COMPONENT>(c);
+    const T_THETA_LOOKUP lookup{&in.section, &in.material, in.length};
+    double deform = 0.0;
+    if (yield)
+        deform = IsMoment(static_cast<int>(c))
+                     ? CHingeTheta::CalcThetaMoment(lookup, k, end, curve.initStiffness,
+                                                    side.userStiffness, *yield)
+                     : CHingeTheta::CalcThetaShear(lookup, k, end, curve.initStiffness,
+                                                   side.userStiffness, *yield);
+    std::printf("  %s(%c) %s-end: yield strength %s (%s), yield deformation %s\n",
+                kComponentNames[c], positive ? '+' : '-', end == HINGE_LOCATION::IEnd ? "I" : "J",
+                yield ? FormatText("%.9g", *yield).c_str() : "-",
+                curve.autoYield ? "automatic" : "entered",
+                deform != 0.0 ? FormatText("%.9g", deform).c_str() : "-");
+    return yield.has_value();
+}
+
+/// Both ends, or the one where the hinge is, and both sides of one component.
+bool PrintYieldComponent(const T_YIELD_INPUT& in, std::size_t c, const T_HINGE_COMPONENT& component)
+{
+    bool whole = true;
+    for (const HINGE_LOCATION end : {HINGE_LOCATION::IEnd, HINGE_LOCATION::JEnd}) {
+        const HINGE_LOCATION other =
+            end == HINGE_LOCATION::IEnd ? HINGE_LOCATION::JEnd : HINGE_LOCATION::IEnd;
+        if (component.location == other) continue;
+        const bool j = end == HINGE_LOCATION::JEnd && !component.sameEnds;
+        std::visit(
+            [&](const auto& curve) {
+                const auto& neg = curve.symmetric ? curve.sides.pos : curve.sides.neg;
+                whole &= PrintYieldSide(in, c, component.type, end, curve, curve.sides.pos, true);
+                whole &= PrintYieldSide(in, c, component.type, end, curve, neg, false);
+            },
+            j ? component.curves.J : component.curves.I);
     }
+    return whole;
+}
+
+/// Yield strengths and deformations of a hinge on one element. False when something is missing.
+bool PrintYield(CDBDoc& doc, const T_PHGE_D& hinge, const T_PHGT_D& type)
+{
+    T_YIELD_INPUT in;
+    if (!doc.Attr().GetSectMatlByElem(hinge.element, in.section, in.material) ||
+        !doc.Memb().GetMembLengByIncludeElem(hinge.element, in.length)) {
+        std::printf("element %d: section, material or member is missing\n", hinge.element);
+        return false;
+    }
+    in.known = CSectionStrength::Calc(in.section, in.material, in.strength, in.fault);
+    std::printf("element %d, hinge type %s, section %s, material %s, member length %.6g\n",
+                hinge.element, type.name.c_str(), in.section.name.c_str(), in.material.name.c_str(),
+                in.length);
+    bool whole = true;
+    for (std::size_t c = 0; c < type.components.size(); ++c) {
+        if (type.components[c].active) whole &= PrintYieldComponent(in, c, type.components[c]);
+    }
+    if (!whole && !in.known)
+        std::printf("  %s\n", zql::lib::MMSGFunction::GetValue(MessageKeyOf(in.fault)).c_str());
+    return whole;
 }
 
 } // namespace
@@ -309,14 +359,18 @@ EXIT_CODE RunHingeYield(const T_HINGE_OPTIONS& o)
 {
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
+    int named = 0;
+    if (!o.type.empty() && !doc.Attr().FindPhgt(o.type, named))
+        return Complain(EXIT_CODE::Usage, o.file + ": no hinge type named \"" + o.type + "\"");
+    bool whole = true;
     for (const auto& entry : doc.Data().Model().hinges) {
         T_PHGE_D hinge;
         T_PHGT_D type;
         if (doc.Attr().GetPhge(entry.first, hinge) && doc.Attr().GetPhgt(hinge.hingeType, type) &&
             (o.type.empty() || o.type == type.name))
-            PrintYield(doc, hinge, type);
+            whole &= PrintYield(doc, hinge, type);
     }
-    return EXIT_CODE::Done;
+    return whole ? EXIT_CODE::Done : EXIT_CODE::NotFound;
 }
 
 EXIT_CODE RunHingeConvert(const T_HINGE_OPTIONS& o)
@@ -341,6 +395,9 @@ EXIT_CODE RunHingeConvert(const T_HINGE_OPTIONS& o)
                             : CPO_HingeSkcvTabFemaDlg::ConvertHingeParamDDy2PR(*fema);
         });
     }
+    if (switched == 0 && !noYield)
+        return Complain(EXIT_CODE::Usage,
+                        o.file + ": hinge type \"" + o.type + "\" has no curve to switch");
     if (noYield)
         return Complain(EXIT_CODE::Usage, o.file + ": hinge type \"" + o.type +
                                               "\": a curve has no yield deformation; enter "
@@ -373,6 +430,10 @@ EXIT_CODE RunHingeAxial(const T_HINGE_OPTIONS& o)
     if (!ok) return Complain(EXIT_CODE::Usage, grid.Messages().back().text);
     grid.Dlg2Data(fema->curves, fema->sides);
     fema->multiCurve = !fema->curves.empty();
+    if (fema->curves.size() == 1)
+        return Complain(EXIT_CODE::Usage,
+                        zql::lib::MMSGFunction::GetValue("IDS_RPS_MULTI_CURVE_COUNT"));
+    std::printf("%zu axial forces\n", fema->curves.size());
     return StoreType(doc, key, type, o.out);
 }
 

@@ -195,8 +195,18 @@ int main(int argc, char** argv)
         app.parse(argc, argv);
     } catch (const CLI::ParseError& e) {
         if (e.get_exit_code() == 0) return app.exit(e); // --help, --version
-        std::fprintf(stderr, "qm-rps: %s (see qm-rps --help)\n", e.what());
+        const bool unknown =
+            argc > 1 && argv[1][0] != '-' &&
+            app.get_subcommands([&](const CLI::App* s) { return s->get_name() == argv[1]; })
+                .empty();
+        const std::string what =
+            unknown ? "unknown command \"" + std::string(argv[1]) + "\"" : e.what();
+        std::fprintf(stderr, "qm-rps: %s (see qm-rps --help)\n", what.c_str());
         return ToInt(EXIT_CODE::Usage);
+    }
+    if (std::fflush(stdout) != 0 || std::ferror(stdout) != 0) {
+        std::fprintf(stderr, "qm-rps: standard output can't be written\n");
+        return ToInt(EXIT_CODE::NoAccess);
     }
     return ToInt(code);
 }

@@ -58,6 +58,21 @@ json OneTargetJson(const T_TARGET_DISP& t)
             {"bilinear_fits", t.iterations}};
 }
 
+/// How each target displacement came about, found or not.
+json DerivationJson(const T_PUSH_EVALUATION& e)
+{
+    json all = json::array();
+    for (std::size_t i = 0; i < e.targets.size(); ++i) {
+        T_TARGET_DISP t = e.targets[i];
+        json state{{"limit_state", e.targets.size() > 1 ? kLimitStateNames[i] : "SD"},
+                   {"found", t.found}};
+        t.found = t.Tstar > 0.0;
+        state.update(OneTargetJson(t));
+        all.push_back(state);
+    }
+    return all;
+}
+
 json TargetJson(const T_PUSH_EVALUATION& e)
 {
     if (!e.IsTarget() || e.result == 0) return nullptr;
@@ -148,6 +163,7 @@ json EvaluationJson(const T_PUSH_EVALUATION& e)
            {"messages", json::array()}};
     o["factors"]["note"] = e.gammaNote;
     AddPoints(o, e);
+    if (e.IsTarget()) o["derivation"] = DerivationJson(e);
     for (const auto& m : e.messages)
         o["messages"].push_back({{"key", m.key}, {"text", m.text}});
     o["trials"] = e.trace.size();

@@ -279,3 +279,15 @@ int CPostCtrl::GetPushoverStoryDriftRatio(int loadCase, int step, double& kind1,
     kind2 = largest[1];
     return 1;
 }
+
+bool CPostCtrl::HasStoreyGaps(int loadCase) const
+{
+    const auto source = m_data.Content().results.find(loadCase);
+    if (source == m_data.Content().results.end()) return false;
+    const auto known = [&](const auto& entry) {
+        return std::ranges::any_of(entry.second.nodes,
+                                   [&](int node) { return source->second->HasNode(node); });
+    };
+    const auto& storeys = m_data.Model().storeys;
+    return std::ranges::any_of(storeys, known) && !std::ranges::all_of(storeys, known);
+}

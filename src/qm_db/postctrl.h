@@ -72,6 +72,10 @@ public:
     [[nodiscard]] int GetPushoverStoryDriftRatio(int loadCase, int step, double& kind1,
                                                  double& kind2);
 
+    /// True when some storeys have nodes with results and others none: drifts then span several
+    /// storeys.
+    bool HasStoreyGaps(int loadCase) const;
+
 private:
     int ReadSeries(int node, const std::vector<double>*& out);
     int ReadCurve();

@@ -214,6 +214,7 @@ void CPO_HingeTypeDlg::OnLocationCtrl(HINGE_COMPONENT c, HINGE_LOCATION location
 
 void CPO_HingeTypeDlg::OnIJSymmetryRdo(HINGE_COMPONENT c, bool sameEnds)
 {
+    if (At(c).sameEnds == sameEnds) return;
     At(c).sameEnds = sameEnds;
     At(c).curves.J = At(c).curves.I;
 }

@@ -13,7 +13,7 @@ struct T_KEYS {
 
 // In the order of PUSH_OUTCOME.
 // clang-format off
-constexpr std::array<T_KEYS, 28> kKeys{{
+constexpr std::array<T_KEYS, 29> kKeys{{
     {"", ""},
     {"IDS_QM_OUTCOME_CONVERGED", "IDS_QM_ADVICE_CONVERGED"},
     {"IDS_QM_OUTCOME_ELASTIC", "IDS_QM_ADVICE_ELASTIC"},
@@ -42,9 +42,10 @@ constexpr std::array<T_KEYS, 28> kKeys{{
     {"IDS_QM_OUTCOME_ZERO_DEMAND", "IDS_QM_ADVICE_ZERO_DEMAND"},
     {"IDS_QM_OUTCOME_TARGET_BEYOND", "IDS_QM_ADVICE_TARGET_BEYOND"},
     {"IDS_QM_OUTCOME_NO_TRIAL_POINT", "IDS_QM_ADVICE_TRIAL_BEYOND"},
+    {"IDS_QM_OUTCOME_TARGET_BELOW", "IDS_QM_ADVICE_TARGET_BELOW"},
 }};
 // clang-format on
-static_assert(kKeys.size() == static_cast<std::size_t>(PUSH_OUTCOME::TrialBeyond) + 1);
+static_assert(kKeys.size() == static_cast<std::size_t>(PUSH_OUTCOME::TargetBelow) + 1);
 
 } // namespace
 

@@ -31,7 +31,8 @@ enum class PUSH_OUTCOME {
     BilinearTooShort,
     ZeroDemand,
     TargetBeyond,
-    TrialBeyond // no trial point either: the capacity ends before it
+    TrialBeyond, // no trial point either: the capacity ends before it
+    TargetBelow  // the curve starts beyond the target
 };
 
 /// An outcome with its number, where it has one (trials of a cycle).

@@ -12,6 +12,7 @@ namespace {
 constexpr double kPrecise = 1e-10; // of the displacement
 constexpr double kBalanced = 1e-7; // what is left of demand / capacity - 1 at a point, not a jump
 constexpr int kMaxHalvings = 80;
+constexpr std::size_t kSamples = 2000; // along the whole curve
 
 double Period(double Sd, double Sa, double g)
 {
@@ -131,9 +132,14 @@ std::vector<T_BALANCED_POINT> CPushOverAllPoints::Find()
         last = p;
     };
     visit(curve.At(0));
+    const std::size_t parts = std::clamp<std::size_t>(kSamples / (curve.Size() - 1), 4, 500);
     for (std::size_t i = 0; i + 1 < curve.Size(); ++i) {
-        visit(Between(curve.At(i), curve.At(i + 1)));
-        visit(curve.At(i + 1));
+        const T_POINT2 a = curve.At(i), b = curve.At(i + 1);
+        for (std::size_t k = 1; k < parts; ++k) {
+            const double w = static_cast<double>(k) / static_cast<double>(parts);
+            visit({a.x + w * (b.x - a.x), a.y + w * (b.y - a.y)});
+        }
+        visit(b);
     }
     return points;
 }

@@ -19,7 +19,8 @@ public:
     CPushOverAllPoints(CPushOverPerfPtRecord& owner, bool fema440);
 
     /// All such points in the order of the curve, to 1e-10 of the displacement. Sign changes of
-    /// demand - capacity are bracketed at the curve's points and half way between them; a jump
+    /// demand - capacity are bracketed at about 2,000 points along the curve, at least four in each
+    /// segment, so that two such points closer than that may go unseen; a jump
     /// (the damping sets in at a finite ductility) is no point.
     std::vector<T_BALANCED_POINT> Find();
 

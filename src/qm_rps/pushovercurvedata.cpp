@@ -63,7 +63,7 @@ int CPushOverCurveData::BeforePreparePOCurveData(const T_PUSH_CURVE_SETTINGS& se
     const double control = ControlShape();
     const bool massBased = IsSpectral(m_plotType) && !m_factors.eigenBased && control != 0.0;
     CalcMassFactors(massBased ? control : 0.0);
-    if (massBased) CheckStoreyMasses();
+    if (IsSpectral(m_plotType) && !m_factors.eigenBased) CheckStoreyMasses();
     const double total = DirectionMass(Direction());
     m_massError = !(std::fabs(total) > kNoMass) || !massBased;
     m_factors.mass = total;

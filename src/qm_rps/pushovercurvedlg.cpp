@@ -25,8 +25,7 @@ void Assert(int line)
 /// How Gamma is defined: by the mode as recorded, from the nodal masses, or for NTC.
 const char* GammaKey(const T_EVAL_D& eval, const T_PUSH_FACTORS& factors)
 {
-    if (eval.method >= PUSH_METHOD::Ntc2008 && !factors.eigenBased)
-        return "IDS_RPS_PO_CURVE_GAMMA_NTC";
+    if (eval.method >= PUSH_METHOD::Ntc2008) return "IDS_RPS_PO_CURVE_GAMMA_NTC";
     return factors.eigenBased ? "IDS_RPS_PO_CURVE_GAMMA_FEMA" : "IDS_RPS_PO_CURVE_GAMMA_2D_FEMA";
 }
 
@@ -75,7 +74,7 @@ int CPushOverCurveDlg::SetEvaluation(const T_EVAL_D& evaluation)
     }
     m_settingsError.clear();
     m_eval = evaluation;
-    m_eval.masonry = evaluation.masonry.value_or(ExistEC8OrMasonry());
+    m_eval.masonry = evaluation.masonry.value_or(false) || ExistEC8OrMasonry();
     m_spectrumRecord = record;
     m_pushover = pushover;
     T_DAMP_PARAM damping;
@@ -202,6 +201,10 @@ int CPushOverCurveDlg::UpdatePerformancePoint()
     SetModelPath(path.empty() ? path : CFileCtrl::GetFilePathAndNameWithoutExtension(path));
     const auto calculator = MakePerfPtCalculator(m_eval.method, m_result.procedure - 'A', *this);
     if (!calculator) return Fail(PUSH_OUTCOME::NoCapacity, failed);
+    constexpr int kUserType = 3;
+    if (m_eval.method == PUSH_METHOD::Atc40 && Damping().behaviorType == kUserType &&
+        !m_eval.userDamping)
+        ShowMessage("IDS_QM_WARN_NO_USER_DAMPING");
     double Dp = 0.0, Ap = 0.0;
     std::optional<double> beta;
     const int result = calculator->CalcPerformancePoint(Dp, Ap, beta, nullptr);
@@ -263,7 +266,14 @@ int CPushOverCurveDlg::CalcAdditionalPerformancePoint(const std::string& spectru
     other.spectrum = spectrum;
     CPushOverCurveDlg driver(m_doc);
     driver.SetFindAllPoints(false);
-    if (m_result.IsTarget() || !driver.SetEvaluation(other)) return 0;
+    if (m_result.IsTarget()) {
+        ShowMessage("IDS_QM_NO_ADDITIONAL_POINT");
+        return 0;
+    }
+    if (!driver.SetEvaluation(other)) {
+        ShowMessage("IDS_QM_SETTINGS", driver.SettingsError());
+        return 0;
+    }
     const int result = driver.Evaluate();
     m_result.additionalPoints.push_back(
         {spectrum, result, driver.Result().point, driver.Result().outcome});
@@ -307,6 +317,7 @@ T_BILINEAR_OPTIONS CPushOverCurveDlg::BilinearOptions() const
 // Ratio of the chosen kind; step 0 is the model at rest.
 std::optional<double> CPushOverCurveDlg::DriftOfStep(int step)
 {
+    m_driftUsed = true;
     if (step == 0) return 0.0;
     double kind1 = 0.0, kind2 = 0.0;
     const int kind = m_eval.driftKind.value_or(1);
@@ -344,7 +355,7 @@ T_TARGET_INPUT CPushOverCurveDlg::TargetInput()
 
 int CPushOverCurveDlg::UpdateTargetDispData()
 {
-    m_driftMissing = false;
+    m_driftMissing = m_driftUsed = false;
     const char* const failed = "IDS_RPS_FAILED_FINDING_TARGET_DISPLACEMENT";
     T_TARGET_INPUT input = TargetInput();
     const bool enabled = std::ranges::any_of(
@@ -359,7 +370,10 @@ int CPushOverCurveDlg::UpdateTargetDispData()
     else
         found = evaluation.UpdateTargetDispDataEC8();
     if (!found || evaluation.StrengthDropMissing()) ShowMessage(failed);
-    if (m_driftMissing) ShowMessage("IDS_QM_WARN_NO_DRIFT");
+    if (m_driftMissing)
+        ShowMessage("IDS_QM_WARN_NO_DRIFT");
+    else if (m_driftUsed && m_doc.Post().HasStoreyGaps(m_pushover))
+        ShowMessage("IDS_QM_WARN_STOREY_GAPS");
     m_result.bilinear = evaluation.Bilinear();
     m_result.targets = evaluation.Targets();
     m_result.limitStates = evaluation.Rows();
@@ -431,7 +445,10 @@ void CPushOverCurveDlg::PlotCurve()
     settings.eigenFactors = m_eval.eigenFactors.value_or(true);
     settings.gravity = GetGravity(1);
     CPushOverCurveData data(m_doc);
-    if (data.Calc(settings)) m_result.curve = {data.PlotType(), data.Displacement(), data.Force()};
+    const bool shear = type == PLOT_TYPE::ShearCoeff || type == PLOT_TYPE::Drift;
+    const int made = data.Calc(settings);
+    if (made && shear && data.Factors().weight == 0.0) ShowMessage("IDS_QM_WARN_NO_WEIGHT");
+    if (made) m_result.curve = {data.PlotType(), data.Displacement(), data.Force()};
 }
 
 std::string CPushOverCurveDlg::PerfPointCell() const

@@ -91,7 +91,7 @@ private:
     int m_pushover = 0;
     bool m_storeSteps = true;
     bool m_findAllPoints = true;
-    bool m_driftMissing = false;
+    bool m_driftMissing = false, m_driftUsed = false;
     CPushOverCurveData m_curve;
     CPushOverAdditionalStepDlg m_additionalSteps;
     // What the curve and the spectrum at hand were made from; both are kept while that stands.

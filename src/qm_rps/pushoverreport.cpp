@@ -11,7 +11,7 @@ namespace {
 
 using zql::lib::MMSGFunction;
 
-constexpr const char* kVersion = "0.1.0";
+constexpr const char* kVersion = QM_RPS_VERSION;
 constexpr const char* kLine = "_____________________________________________\n\n";
 constexpr const char* kDashes = "--------------------   -----------------------------------   "
                                 "------------------------- \n";

@@ -121,9 +121,20 @@ void CPushOverTargetEvaluation::FinishOutcome()
         }
         return;
     }
-    const bool beyond =
-        std::ranges::any_of(m_rows, [](const T_LIMIT_ROW& r) { return r.demand && !r.demandStep; });
-    m_outcome = {beyond ? PUSH_OUTCOME::TargetBeyond : PUSH_OUTCOME::TargetFound, 0};
+    const auto& d = m_in.capacity.Sd;
+    const double last = m_in.gamma * *std::ranges::max_element(d);
+    const auto off = [&](bool beyond) {
+        return std::ranges::any_of(m_rows, [&](const T_LIMIT_ROW& r) {
+            return r.demand && !r.demandStep && (std::fabs(*r.demand) > std::fabs(last)) == beyond;
+        });
+    };
+    const bool zero = std::ranges::any_of(
+        m_targets, [](const T_TARGET_DISP& t) { return t.found && t.Se == 0.0; });
+    m_outcome = {zero         ? PUSH_OUTCOME::ZeroDemand
+                 : off(true)  ? PUSH_OUTCOME::TargetBeyond
+                 : off(false) ? PUSH_OUTCOME::TargetBelow
+                              : PUSH_OUTCOME::TargetFound,
+                 0};
 }
 
 int CPushOverTargetEvaluation::UpdateTargetDispDataEC8()

@@ -86,25 +86,7 @@ void ExpectRefused(const T_RUN& run, const std::string& label, const std::string
     EXPECT_EQ(std::vector<std::string>{"bad.json"}, folder.Names()) << label;
 }
 
-TEST(BadCase, TheSmallCaseItselfIsGood)
-{
-    const CTempFolder folder;
-    WriteText(folder / "good.json", kSmallCase);
-    EXPECT_EQ(0, RunProgram({"evaluate", folder / "good.json"}).code);
-}
-
-TEST(BadCase, EvaluateRefusesEachWithOneLineAndWritesNothing)
-{
-    const CTempFolder folder;
-    for (const T_BAD_CASE& c : kBadCases) {
-        WriteText(folder / "bad.json", SmallCaseWith(c.from, c.to));
-        const T_RUN run = RunProgram({"evaluate", folder / "bad.json", "--json", folder / "o.json",
-                                      "--report", folder / "o.txt"});
-        ExpectRefused(run, c.label, c.place, folder);
-    }
-}
-
-TEST(BadCase, ImportRefusesAndKeepsTheModelThatIsThere)
+TEST(BadCase, EachIsRefusedWithOneLineAndNothingIsWritten)
 {
     const CTempFolder folder, models;
     WriteText(folder / "bad.json", kSmallCase);
@@ -112,16 +94,21 @@ TEST(BadCase, ImportRefusesAndKeepsTheModelThatIsThere)
     const std::string before = ReadText(models / "m.qmdb");
     for (const T_BAD_CASE& c : kBadCases) {
         WriteText(folder / "bad.json", SmallCaseWith(c.from, c.to));
-        const T_RUN run = RunProgram({"import", folder / "bad.json", models / "m.qmdb"});
+        const T_RUN run = RunProgram({"evaluate", folder / "bad.json", "--json", folder / "o.json",
+                                      "--report", folder / "o.txt"});
         ExpectRefused(run, c.label, c.place, folder);
+        ExpectRefused(RunProgram({"import", folder / "bad.json", models / "m.qmdb"}), c.label,
+                      c.place, folder);
         EXPECT_EQ(before, ReadText(models / "m.qmdb")) << c.label;
         EXPECT_EQ(std::vector<std::string>{"m.qmdb"}, models.Names()) << c.label;
     }
 }
 
-TEST(BadCase, ADocumentNested200000DeepIsRefused)
+TEST(BadCase, AnEmptyFileAndOneNested200000DeepAreRefused)
 {
     const CTempFolder folder;
+    WriteText(folder / "bad.json", "");
+    ExpectRefused(RunProgram({"evaluate", folder / "bad.json"}), "empty", "empty", folder);
     const std::size_t depth = 200000;
     WriteText(folder / "bad.json", std::string(depth, '[') + std::string(depth, ']'));
     ExpectRefused(RunProgram({"info", folder / "bad.json"}), "nested", "line 1", folder);
@@ -130,59 +117,6 @@ TEST(BadCase, ADocumentNested200000DeepIsRefused)
         objects += "{\"nodes\":";
     WriteText(folder / "bad.json", objects);
     ExpectRefused(RunProgram({"info", folder / "bad.json"}), "nested", "line 1", folder);
-}
-
-TEST(BadCase, AnEmptyFileIsRefused)
-{
-    const CTempFolder folder;
-    WriteText(folder / "bad.json", "");
-    ExpectRefused(RunProgram({"evaluate", folder / "bad.json"}), "empty", "empty", folder);
-}
-
-struct T_BAD_RECORDER {
-    const char* label;
-    const char* text; // of the table r.out; "u.out" has three good rows
-    const char* place;
-};
-
-TEST(BadCase, RecorderFilesAreRefusedByFileLineAndColumn)
-{
-    const T_BAD_RECORDER kTables[] = {
-        {"text for a number", "1 280\n2 abc\n3 336\n", "r.out: line 2, column 2"},
-        {"not finite", "1 280\n2 300\n3 nan\n", "r.out: line 3, column 2"},
-        {"missing column", "1 280\n2\n3 336\n", "r.out: line 2, column 2"},
-        {"number with a unit", "1 280\n2 300kN\n3 336\n", "r.out: line 2, column 2"},
-        {"too few rows", "1 280\n2 300\n", "2 rows"},
-        {"empty", "", "r.out"},
-    };
-    const std::string steps = R"("files": {
-     "load_factor": {"path": "u.out", "column": 1},
-     "base_reaction": {"path": "r.out", "column": 2},
-     "displacement": {"2": {"path": "u.out", "column": 2}}})";
-    std::string text = SmallCaseWith("\"load_factor\": [1, 2, 3]", steps);
-    const auto from = text.find(",\n    \"base_reaction\": [");
-    const auto to = text.find("\n   }", from);
-    ASSERT_NE(std::string::npos, from);
-    ASSERT_NE(std::string::npos, to);
-    text.erase(from, to - from);
-
-    const CTempFolder folder;
-    WriteText(folder / "case.json", text);
-    WriteText(folder / "u.out", "1 0.028\n2 0.0653125\n3 0.14\n");
-    WriteText(folder / "r.out", "1 280\n2 300\n3 336\n");
-    ASSERT_EQ(0, RunProgram({"evaluate", folder / "case.json"}).code) << "the good tables";
-    for (const T_BAD_RECORDER& c : kTables) {
-        WriteText(folder / "r.out", c.text);
-        const T_RUN run = RunProgram({"import", folder / "case.json", folder / "m.qmdb"});
-        EXPECT_EQ(3, run.code) << c.label;
-        EXPECT_EQ(1U, Lines(run.err).size()) << c.label << ": " << run.err;
-        EXPECT_NE(std::string::npos, run.err.find(c.place)) << c.label << ": " << run.err;
-        EXPECT_EQ(3U, folder.Names().size()) << c.label;
-    }
-    std::filesystem::remove(folder / "r.out");
-    const T_RUN run = RunProgram({"import", folder / "case.json", folder / "m.qmdb"});
-    EXPECT_EQ(4, run.code);
-    EXPECT_NE(std::string::npos, run.err.find("r.out")) << run.err;
 }
 
 // What is unusual, but valid.

@@ -80,32 +80,4 @@ TEST(Examples, RecorderFilesGiveTheSolversOwnCurve)
     }
 }
 
-TEST(Examples, HaveTheStepsThatTheSolverRan)
-{
-    const std::pair<const char*, std::size_t> kCounts[] = {{"steel-frame-2-storey", 648},
-                                                           {"rc-frame-2-storey", 541},
-                                                           {"rc-frame-3-storey", 500},
-                                                           {"rc-space-frame-3-storey", 300}};
-    for (const auto& [name, count] : kCounts) {
-        const json document = Exported(name);
-        for (const json& push : document.at("pushover")) {
-            EXPECT_EQ(count, push.at("steps").at("load_factor").size()) << name;
-            for (const auto& series : push.at("steps").at("displacement"))
-                EXPECT_EQ(count, series.size()) << name;
-        }
-    }
-}
-
-TEST(Examples, TheCurvesPeakIsThatOfTheSolver)
-{
-    const auto peakOf = [](const json& steps) {
-        double peak = 0.0;
-        for (const json& v : steps.at("base_reaction"))
-            peak = std::max(peak, v.get<double>());
-        return peak;
-    };
-    const json steel = Exported("steel-frame-2-storey");
-    EXPECT_NEAR(301.0, peakOf(StepsOf(steel, "PX_MODE1")), 0.5); // "peak 301 kip at 3.2 in"
-}
-
 } // namespace

@@ -5,14 +5,6 @@
 
 namespace {
 
-TEST(ExitCode, Is0WhenEveryPointWasFound)
-{
-    const T_RUN run = RunProgram({"evaluate", ExampleCase("first-steps")});
-    EXPECT_EQ(0, run.code);
-    EXPECT_EQ("", run.err);
-    EXPECT_NE(std::string::npos, run.out.find("PX ATC-40 A"));
-}
-
 TEST(ExitCode, Is1WhenOnePointWasNotFound)
 {
     const std::string file = ExampleCase("steel-frame-2-storey");
@@ -44,16 +36,6 @@ TEST(ExitCode, Is2ForWrongUsage)
         EXPECT_EQ("", run.out) << label;
         EXPECT_EQ(1U, Lines(run.err).size()) << label << ": " << run.err;
     }
-}
-
-TEST(ExitCode, Is3ForABadInputFile)
-{
-    const CTempFolder folder;
-    WriteText(folder / "bad.json", "{\"format\": \"another\"}");
-    const T_RUN run = RunProgram({"evaluate", folder / "bad.json"});
-    EXPECT_EQ(3, run.code);
-    EXPECT_EQ("", run.out);
-    EXPECT_EQ(1U, Lines(run.err).size()) << run.err;
 }
 
 TEST(ExitCode, Is4WhenAFileCantBeReadOrWritten)

@@ -10,18 +10,6 @@ namespace {
 using json = nlohmann::json;
 const char* const kOne = "PX ATC-40 A";
 
-TEST(Outputs, JsonOnStandardOutputIsTheFileAndNothingElse)
-{
-    const CTempFolder folder;
-    const std::string file = ExampleCase("first-steps");
-    const T_RUN toFile = RunProgram({"evaluate", file, "--json", folder / "o.json"});
-    const T_RUN toOut = RunProgram({"evaluate", file, "--json", "-"});
-    ASSERT_EQ(0, toFile.code) << toFile.err;
-    ASSERT_EQ(0, toOut.code) << toOut.err;
-    EXPECT_EQ(ReadText(folder / "o.json"), toOut.out);
-    EXPECT_FALSE(toFile.out.empty());
-}
-
 TEST(Outputs, JsonHasTheDocumentedKeysAndNoOthers)
 {
     const std::set<std::string> kKeys{
@@ -36,6 +24,7 @@ TEST(Outputs, JsonHasTheDocumentedKeysAndNoOthers)
         for (const auto& item : r.items())
             keys.insert(item.key());
         EXPECT_EQ(r.at("trials") != 0, keys.erase("all_points") == 1) << r.at("name");
+        EXPECT_EQ(r.at("trials") == 0, keys.erase("derivation") == 1) << r.at("name");
         EXPECT_EQ(kKeys, keys) << r.at("name");
         const json flat = r.flatten();
         for (const auto& part : flat.items()) {
@@ -46,15 +35,6 @@ TEST(Outputs, JsonHasTheDocumentedKeysAndNoOthers)
                 << key << " is not in docs/file-formats.md";
         }
     }
-}
-
-TEST(Outputs, OnlyRunsTheEvaluationOfThatName)
-{
-    const T_RUN run =
-        RunProgram({"evaluate", ExampleCase("first-steps"), "--only", kOne, "--json", "-"});
-    const json all = json::parse(run.out);
-    ASSERT_EQ(1U, all.size());
-    EXPECT_EQ(kOne, all[0].at("name"));
 }
 
 TEST(Outputs, AdditionalStepsAndSpectraStandBesideTheResult)
@@ -97,18 +77,6 @@ TEST(Outputs, CompareListsEveryMethodWithTheSpread)
     EXPECT_EQ(2, RunProgram({"compare", file, "--push", "none", "--spectrum", "ATC"}).code);
 }
 
-TEST(Outputs, TraceHasOneLinePerTrial)
-{
-    const T_RUN run =
-        RunProgram({"evaluate", ExampleCase("first-steps"), "--only", kOne, "--trace"});
-    const auto from = run.out.find("PX ATC-40 A: trials");
-    ASSERT_NE(std::string::npos, from) << run.out;
-    const std::vector<std::string> lines = Lines(run.out.substr(from));
-    ASSERT_EQ(4U, lines.size()); // title, column names, two trials
-    EXPECT_NE(std::string::npos, lines[2].find("36.363")) << lines[2];
-    EXPECT_NE(std::string::npos, lines[3].find("34.653")) << lines[3];
-}
-
 TEST(Outputs, ReportHasItsSectionsAndTheNumbersOfTheJson)
 {
     const CTempFolder folder;
@@ -130,18 +98,6 @@ TEST(Outputs, ReportHasItsSectionsAndTheNumbersOfTheJson)
     for (const std::string& line : Lines(curve))
         rows += line.find("e-0") != std::string::npos && line.find(':') == std::string::npos;
     EXPECT_EQ(41U, rows); // steps 0 to 40
-}
-
-TEST(Outputs, ReportsOfSeveralEvaluationsFollowOneAnother)
-{
-    const CTempFolder folder;
-    ASSERT_EQ(
-        0,
-        RunProgram({"evaluate", ExampleCase("first-steps"), "--report", folder / "all.txt"}).code);
-    std::size_t heads = 0;
-    for (const std::string& line : Lines(ReadText(folder / "all.txt")))
-        heads += line.starts_with("qm_rps ");
-    EXPECT_EQ(8U, heads);
 }
 
 TEST(Outputs, ItalianMessagesWithTheSameNumbers)
@@ -187,34 +143,6 @@ TEST(Outputs, PictureHasTitleAxesLegendAndPoint)
           "Reduced demand", "Capacity", "Trial points", "Performance point", "Sd = 0.07752 m",
           "T_eff = 1.00", "T0 = 0.628 s", "Outcome: converged"})
         EXPECT_NE(std::string::npos, words.find(text)) << text;
-}
-
-TEST(Outputs, PicturesOfSeveralEvaluationsAreNumbered)
-{
-    const CTempFolder folder;
-    ASSERT_EQ(
-        0, RunProgram({"evaluate", ExampleCase("first-steps"), "--plot", folder / "p.svg"}).code);
-    const std::vector<std::string> expected{"p-1.svg", "p-2.svg", "p-3.svg", "p-4.svg",
-                                            "p-5.svg", "p-6.svg", "p-7.svg", "p-8.svg"};
-    EXPECT_EQ(expected, folder.Names());
-    const std::string ec8 = Words(ReadText(folder / "p-6.svg"));
-    for (const char* text : {"PX EC8", "Bilinear capacity", "SD demand"})
-        EXPECT_NE(std::string::npos, ec8.find(text)) << text;
-}
-
-TEST(Outputs, PngAndPdfStartAsTheirFormatsDo)
-{
-    const CTempFolder folder;
-    const std::pair<const char*, std::string> kFormats[] = {{"p.png", "\x89PNG\r\n"},
-                                                            {"p.pdf", "%PDF-1."}};
-    for (const auto& [name, head] : kFormats) {
-        ASSERT_EQ(0, RunProgram({"evaluate", ExampleCase("first-steps"), "--only", kOne, "--plot",
-                                 folder / name})
-                         .code);
-        const std::string bytes = ReadText(folder / name);
-        EXPECT_EQ(head, bytes.substr(0, head.size())) << name;
-        EXPECT_GT(bytes.size(), 5000U) << name;
-    }
 }
 
 TEST(Outputs, AnUnknownPictureFormatIsWrongUsage)

@@ -45,15 +45,6 @@ TEST(RoundTrip, ExportImportExportIsTheSameText)
     }
 }
 
-TEST(RoundTrip, AModelImportedTwiceIsTheSameFile)
-{
-    const CTempFolder folder;
-    const std::string file = ExampleCase("steel-frame-2-storey");
-    ASSERT_EQ(0, RunProgram({"import", file, folder / "a.qmdb"}).code);
-    ASSERT_EQ(0, RunProgram({"import", file, folder / "b.qmdb"}).code);
-    EXPECT_EQ(ReadText(folder / "a.qmdb"), ReadText(folder / "b.qmdb"));
-}
-
 TEST(RoundTrip, CaseFileAndModelGiveTheSameResultsToTheLastByte)
 {
     const CTempFolder folder;

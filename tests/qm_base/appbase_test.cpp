@@ -18,25 +18,3 @@ TEST(AppBase, KeepsAndTracesAssertionsAndCarriesOn)
               CAppBase::TakeAssertions_ST());
     EXPECT_TRUE(CAppBase::TakeAssertions_ST().empty());
 }
-
-TEST(AppBase, KeepsTheLatestThousand)
-{
-    CAppBase::TakeAssertions_ST();
-    for (int line = 1; line <= 1003; ++line)
-        CAppBase::ReleaseAssertion_ST("x", line);
-    const auto kept = CAppBase::TakeAssertions_ST();
-    ASSERT_EQ(1000u, kept.size());
-    EXPECT_EQ(4, kept.front().line);
-    EXPECT_EQ(1003, kept.back().line);
-}
-
-TEST(AppBase, ReportsNothingWhileSwitchedOff)
-{
-    CAppBase::TakeAssertions_ST();
-    EXPECT_TRUE(CAppBase::IsReleaseAssert_ST());
-    CAppBase::EnableReleaseAssert_ST(false);
-    EXPECT_FALSE(CAppBase::IsReleaseAssert_ST());
-    CAppBase::ReleaseAssertion_ST("x", 1);
-    CAppBase::EnableReleaseAssert_ST(true);
-    EXPECT_TRUE(CAppBase::TakeAssertions_ST().empty());
-}

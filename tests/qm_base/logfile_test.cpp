@@ -1,26 +1,6 @@
 #include "qm_base/logfile.h"
 
-#include <filesystem>
-#include <fstream>
 #include <gtest/gtest.h>
-#include <sstream>
-
-namespace fs = std::filesystem;
-
-TEST(LogFile, AppendsToWhatIsThere)
-{
-    const fs::path path = fs::path(testing::TempDir()) / "qm_base_logfile_test.txt";
-    fs::remove(path);
-    EXPECT_EQ(1, CLogFile(path.string()).Write("one\n"));
-    const CLogFile log(path.string());
-    EXPECT_EQ(1, log.Write("two"));
-    EXPECT_EQ(1, log.Write("\r\n"));
-
-    std::ostringstream text;
-    text << std::ifstream(path, std::ios::binary).rdbuf();
-    EXPECT_EQ("one\ntwo\r\n", text.str());
-    fs::remove(path);
-}
 
 TEST(LogFile, RefusesAFileThatCannotBeWritten)
 {

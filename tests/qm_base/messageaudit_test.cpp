@@ -39,13 +39,6 @@ TEST(MessageAudit, FindsEachKindOfFault)
         EXPECT_EQ(c.findings, Audit(c.en, c.it, c.source)) << c.label;
 }
 
-TEST(MessageAudit, ReadsKeysFromStringLiterals)
-{
-    EXPECT_EQ((Lines{"IDS_A", "IDS_B", "IDS_A"}),
-              KeysInSource("f(\"IDS_A\",\"IDS_B\"); IDS_C; \"x IDS_D\" + \"IDS_A\""));
-    EXPECT_EQ(Lines{"IDS_open"}, KeysInSource("\"IDS_open"));
-}
-
 TEST(MessageAudit, CataloguesAndSourcesOfThisProgramAgree)
 {
     std::vector<T_AUDIT_TEXT> catalogues;

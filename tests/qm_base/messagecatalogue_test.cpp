@@ -35,13 +35,3 @@ TEST(MessageCatalogue, NamesEveryFaultAndKeepsTheRest)
     EXPECT_EQ(expected, faults);
     EXPECT_EQ((CMessageCatalogue::Texts{{"A", "first"}, {"G", "good"}}), c.All());
 }
-
-TEST(MessageCatalogue, FallsBackToTheSecondLanguageThenToTheKey)
-{
-    CMessageCatalogue it, en;
-    EXPECT_TRUE(it.Read("A = uno").empty());
-    EXPECT_TRUE(en.Read("A = one\nB = two").empty());
-    EXPECT_EQ("uno", TextIn(it, en, "A"));
-    EXPECT_EQ("two", TextIn(it, en, "B"));
-    EXPECT_EQ("C", TextIn(it, en, "C"));
-}

@@ -19,9 +19,3 @@ TEST(MessageText, FillsPlacesInTheOrderOfTheText)
     for (const auto& [text, filled] : kCases)
         EXPECT_EQ(filled, FillPlaces(text, args)) << text;
 }
-
-TEST(MessageText, NamesThePlacesOfAText)
-{
-    EXPECT_EQ((std::set<std::size_t>{1, 12}), PlacesOf("{12} {1} {1} {{3} {x} {0}"));
-    EXPECT_TRUE(PlacesOf("none").empty());
-}

@@ -50,13 +50,6 @@ TEST(TextFormat, WritesAPointWhateverTheLocale)
     EXPECT_EQ(before, ProcessText(1.5)) << "the caller's locale must be left as it was";
 }
 
-TEST(TextFormat, WritesTextsOfAnyLength)
-{
-    for (const int length : {0, 1, 255, 256, 257, 5000})
-        EXPECT_EQ(std::string(static_cast<std::size_t>(length), ' '), FormatText("%*s", length, ""))
-            << length;
-}
-
 TEST(TextFormat, ShortestTextReadsBackAsTheSameDouble)
 {
     const std::pair<double, const char*> kCases[] = {

@@ -2,7 +2,6 @@
 
 #include <cmath>
 #include <gtest/gtest.h>
-#include <limits>
 
 TEST(SpectralReduction, FollowsEquations8_9And8_10WithoutLowerBounds)
 {
@@ -28,38 +27,4 @@ TEST(SpectralReduction, FollowsEquations8_9And8_10WithoutLowerBounds)
     EXPECT_NEAR(0.0, f.SRa, 1e-12);
     ASSERT_EQ(1, CalcSpectralReduction(std::exp(2.31 / 0.41), f));
     EXPECT_NEAR(0.0, f.SRv, 1e-12);
-}
-
-TEST(SpectralReduction, RefusesADampingThatHasNoLogarithm)
-{
-    for (const double beta : {0.0, -1.0, std::numeric_limits<double>::quiet_NaN(),
-                              std::numeric_limits<double>::infinity()}) {
-        T_SPEC_REDUCTION f{7.0, 8.0};
-        EXPECT_EQ(0, CalcSpectralReduction(beta, f)) << beta;
-        EXPECT_EQ(7.0, f.SRa);
-        EXPECT_EQ(8.0, f.SRv);
-    }
-}
-
-TEST(SpectralReduction, FloorsRaiseWhatLiesBelowThemAndNothingElse)
-{
-    struct T_CASE {
-        int type;
-        double minA, minV;
-    };
-    const T_CASE cases[] = {// ATC-40 (1996) Table 8-2
-                            {0, 0.33, 0.50},
-                            {1, 0.44, 0.56},
-                            {2, 0.56, 0.67},
-                            {3, 0.10, 0.10}, // user-defined: none
-                            {4, 0.10, 0.10}};
-    for (const T_CASE& c : cases) {
-        T_SPEC_REDUCTION low{0.10, 0.10}, high{0.90, 0.95};
-        ApplyReductionFloors(c.type, low);
-        ApplyReductionFloors(c.type, high);
-        EXPECT_EQ(c.minA, low.SRa) << c.type;
-        EXPECT_EQ(c.minV, low.SRv) << c.type;
-        EXPECT_EQ(0.90, high.SRa) << c.type;
-        EXPECT_EQ(0.95, high.SRv) << c.type;
-    }
 }

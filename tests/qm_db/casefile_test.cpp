@@ -4,12 +4,9 @@
 #include "qm_db/filectrl.h"
 #include "qm_db/jsonnumber.h"
 
-#include <algorithm>
-#include <cmath>
 #include <gtest/gtest.h>
 #include <limits>
 #include <random>
-#include <sstream>
 
 namespace {
 
@@ -53,14 +50,6 @@ T_PUSH_DATA ResultOf(const T_MODEL_CONTENT& content, int push)
     return data;
 }
 
-void ExpectSame(const T_MODEL_CONTENT& a, const T_MODEL_CONTENT& b)
-{
-    EXPECT_EQ(a.model, b.model);
-    ASSERT_EQ(a.results.size(), b.results.size());
-    for (const auto& entry : a.results)
-        EXPECT_EQ(ResultOf(a, entry.first), ResultOf(b, entry.first));
-}
-
 /// The refusal of a text; checks that it is one line, a fault of the input, and changes nothing.
 std::string RefusalOf(const std::string& text)
 {
@@ -97,121 +86,71 @@ struct T_BAD {
 // clang-format off
 const T_BAD kBad[] = {
     // the document
-    {"", "case 1", "case 2", "format: \"qm-rps case 2\", expected \"qm-rps case 1\""},
     {"", "\"gravity\"", "\"gravitas\"", "unknown key \"gravitas\""},
     {"", "\"gravity\"", "\"bad\\nkey\"", "unknown key \"bad\\u000akey\""},
-    {"", "\"every member \\\"given\\\", and più\"", "5", "title: expected a text, found a number"},
-    {"", "\"kips\"", "\"kip\"", "units.force: unknown unit \"kip\"; allowed: N, kN, MN, kgf, tonf, lbf, kips"},
-    {"", "\"in\"", "\"km\"", "units.length: unknown unit \"km\"; allowed: mm, cm, m, in, ft"},
     {"", "386.2", "0", "gravity: gravity must be above 0"},
     {"", "386.2", "null", "gravity: expected a number, found null"},
     {"", "\"nodes\"", "\"storeys\"", "key \"storeys\" appears twice"},
     // nodes
-    {"\"id\": 2", "2", "1", "nodes[1].id: node 1 appears twice"},
     {"\"id\": 2", "2", "0", "nodes[1].id: a node id must be above 0"},
     {"\"id\": 2", "2", "2.5", "nodes[1].id: 2.5 is not an integer"},
     {"\"id\": 2", "2", "4294967298", "nodes[1].id: 4294967298 is not an integer"},
-    {"\"id\": 2", "\"xyz\"", "\"id\"", "nodes[1]: key \"id\" appears twice"},
     {"\"id\": 2", "-0.5", "\"a\"", "nodes[1].xyz[1]: expected a number, found a text"},
     {"\"id\": 2", "-0.5, ", "", "nodes[1].xyz: 2 values, expected 3"},
     {"\"id\": 2", "-0.5", "1e308", "OK"}, // becomes 2.54e306 m
-    {"\"id\": 2", "2.6473775", "-1", "nodes[1].mass[0]: a mass can't be negative"},
     {"\"id\": 2", "2.6473775", "1e308", "nodes[1]: a value is too large"}, // 1.75e313 kg
     {"\"id\": 2", "2.6473775, 1.035643, 0.71607127", "0, 0, 0", "OK"},
     {"\"id\": 2", "\"mass\": [2.6473775, 1.035643, 0.71607127], ", "", "OK"},
     {"\"id\": 2", ", \"restraint\": [0, 1, 0, 1, 0, 1]", "", "OK"},
     {"\"restraint\"", "1, 1, 1", "1, 2, 1", "nodes[0].restraint[1]: a restraint is 0 or 1"},
-    {"\"restraint\"", "1, 1, 1", "1, true, 1", "nodes[0].restraint[1]: expected a number, found true or false"},
     // storeys
     {"storeys", "\"1F\"", "\"\"", "storeys[0].name: a name can't be empty"},
     {"storeys", "\"2F\"", "\"1F\"", "storeys[1].name: \"1F\" appears twice"},
     {"storeys", "\"2F\"", "\"2\\tF\"", "storeys[1].name: a name can't have control characters"},
     {"storeys", "117.06", "0", "storeys[1].height: a storey height must be above 0"},
-    {"storeys", "[7]", "[7, 8]", "storeys[1].nodes[1]: there is no such node"},
     {"storeys", "[7]", "[7, 7]", "storeys[1].nodes[1]: the node appears twice"},
-    {"storeys", "[7]", "7", "storeys[1].nodes: expected an array, found a number"},
     // modes
     {"modes", "0.7", "0", "modes[0].period: a period must be above 0"},
-    {"modes", "\"7\"", "\"8\"", "modes[0].shape.\"8\": there is no such node"},
     {"modes", "\"7\"", "\"07\"", "modes[0].shape.\"07\": the key must be a node id"},
-    {"modes", "\"7\"", "\"top\"", "modes[0].shape.top: the key must be a node id"},
-    {"modes", "1.3, 0", "1.3", "modes[0].participation: 5 values, expected 6"},
     // spectra
-    {"spectra", "\"EC8\"", "\"ATC\"", "spectra[1].name: \"ATC\" appears twice"},
-    {"spectra", "\"atc40\"", "\"atc\"", "spectra[0].kind: unknown spectrum kind \"atc\"; allowed: atc40, ec8-2004, ec8-1994, ntc, user"},
     {"\"atc40\"", "0.4", "0", "spectra[0].Ca: the value must be above 0"},
-    {"\"atc40\"", "0.6", "-0.1", "spectra[0].Cv: the value must be above 0"},
-    {"\"atc40\"", "\"Ca\"", "\"ca\"", "spectra[0]: unknown key \"ca\""},
     {"\"atc40\"", "\"Ca\": 0.4,", "", "spectra[0]: \"Ca\" is missing"},
     {"\"atc40\"", "false", "0", "spectra[0].floors: expected true or false, found a number"},
     {"\"ec8-2004\"", "\"type\": 2", "\"type\": 3", "spectra[1].type: the type is 1 or 2"},
-    {"\"ec8-2004\"", "\"E\"", "\"F\"", "spectra[1].soil: unknown soil \"F\"; allowed: A, B, C, D, E"},
     {"\"ec8-2004\"", "0.35", "0", "spectra[1].ag: the value must be above 0"},
+    {"\"ec8-2004\"", "\"E\"", "\"F\"", "spectra[1].soil: unknown soil \"F\"; allowed: A, B, C, D, E"},
     {"\"ec8-2004\"", "\"damping\": 4", "\"damping\": -1", "spectra[1].damping: damping can't be negative"},
-    {"\"ec8-2004\"", "\"damping\": 4", "\"damping\": 0", "OK"},
-    {"\"ec8-2004\"", "\"S\": 1.1", "\"S\": 0", "spectra[1].S: the value must be above 0"},
     {"\"ec8-2004\"", "\"TB\": 0.1", "\"TB\": 0.5", "spectra[1].TC: TC is below TB"},
     {"\"ec8-2004\"", "\"TD\": 2.5", "\"TD\": 0.3", "spectra[1].TD: TD is below TC"},
     {"\"ec8-2004\"", "\"TC\": 0.4,\n   \"TD\": 2.5", "\"TD\": 0.05", "spectra[1].TD: TD is below TB"},
-    {"\"ec8-2004\"", "\"TC\": 0.4", "\"TC\": 0.1", "OK"},
     {"\"ec8-1994\"", "\"B\"", "\"D\"", "spectra[2].soil: unknown soil \"D\"; allowed: A, B, C"},
-    {"\"ec8-1994\"", "0.3", "-0.3", "spectra[2].ag: the value must be above 0"},
     {"\"ntc\"", "T3", "T5", "spectra[3].topography: unknown topography \"T5\"; allowed: T1, T2, T3, T4"},
-    {"\"ntc\"", "SLD", "SLX", "spectra[3].limit_states: unknown key \"SLX\""},
     {"\"ntc\"", "0.104", "0", "spectra[3].limit_states.SLD.ag: the value must be above 0"},
     {"\"ntc\"", "2.33", "0", "spectra[3].limit_states.SLD.F0: the value must be above 0"},
     {"\"ntc\"", "0.28", "0", "spectra[3].limit_states.SLD.\"TC*\": the value must be above 0"},
-    {"\"user\",", "0.5", "2", "spectra[4].T[2]: periods must ascend"},
     {"\"user\",", "[0, 0.5", "[-1, 0.5", "spectra[4].T[0]: a period can't be negative"},
-    {"\"user\",", "0.6", "-0.6", "spectra[4].Sa[1]: Sa can't be negative"},
-    {"\"user\",", "0.6, 0", "0.6", "spectra[4].Sa: 2 values, expected 3"},
-    {"\"user\",", "[0, 0.5, 2]", "[1]", "spectra[4].T: a spectrum needs at least 2 points"},
     {"\"user\",", "386.4", "-1", "spectra[4].gravity: gravity must be above 0"},
     // pushover load cases
     {"pushover", "\"RZ\"", "\"PX\"", "pushover[1].name: \"PX\" appears twice"},
-    {"pushover", "\"control_node\": 7", "\"control_node\": 9", "pushover[0].control_node: there is no such node"},
-    {"pushover", "\"control_node\": 7", "\"control_node\": 1", "pushover[0].steps.displacement: the control node 1 is missing"},
-    {"pushover", "DX", "X", "pushover[0].direction: unknown direction \"X\"; allowed: DX, DY, DZ, RX, RY, RZ"},
-    {"pushover", "mode x story mass", "modal", "pushover[0].pattern.kind: unknown pattern \"modal\"; allowed: static, acceleration, mode, mode x story mass"},
     {"pushover", ", \"modes\": [1]", "", "pushover[0].pattern: this kind of pattern needs at least one mode number in \"modes\""},
     {"pushover", "[1]", "[2]", "pushover[0].pattern.modes[0]: there is no such mode"},
     {"pushover", "[1]", "[0]", "pushover[0].pattern.modes[0]: mode numbers start at 1"},
-    {"pushover", "\"steps\"", "\"step\"", "pushover[0]: unknown key \"step\""},
-    {"pushover", "[0.5, 1, 1.1]", "[]", "pushover[0].steps.load_factor: there is no step"},
-    {"pushover", "[0.5, 1, 1.1]", "[0.5, 1]", "pushover[0].steps.base_reaction: 3 values, expected 2"},
-    {"pushover", ", 180", "", "pushover[0].steps.base_reaction: 2 values, expected 3"},
-    {"pushover", ", 2.2", "", "pushover[0].steps.displacement.\"2\": 2 values, expected 3"},
-    {"pushover", "180", "true", "pushover[0].steps.base_reaction[2]: expected a number, found true or false"},
     {"pushover", "180", "1e308", "pushover[0].steps.base_reaction: a value is too large"},
-    {"pushover", "\"2\"", "\"5\"", "pushover[0].steps.displacement.\"5\": there is no such node"},
     {"pushover", "\"2\"", "\"7\"", "pushover[0].steps.displacement: key \"7\" appears twice"},
-    {"pushover", "[1.25, 2.5, 2.4]", "[0, 0, 0]", "pushover[0].steps.displacement: a curve of zero displacement: the control node 7 never moves"},
-    {"pushover", "[123.4, 200, 180]", "[0, 0, 0]", "pushover[0].steps.base_reaction: a curve of zero force: every base reaction is 0"},
     {"pushover", "-2]", "-3]", "pushover[0].limit_state_steps.EC8[2]: a step is -2 or above"},
     {"pushover", "-2]", "-2, 1]", "pushover[0].limit_state_steps.EC8: 4 values, expected 3"},
-    {"pushover", "\"EC8\"", "\"EC9\"", "pushover[0].limit_state_steps: unknown key \"EC9\""},
     // evaluations
-    {"evaluations", "\"E2\"", "\"E1\"", "evaluations[1].name: \"E1\" appears twice"},
-    {"evaluations", "\"PX\"", "\"PY\"", "evaluations[0].push: there is no pushover load case \"PY\""},
-    {"evaluations", "\"ATC\"", "\"ATD\"", "evaluations[0].spectrum: there is no spectrum \"ATD\""},
-    {"evaluations", "   \"push\": \"PX\",\n", "", "evaluations[0]: \"push\" is missing"},
-    {"evaluations", "FEMA440", "FEMA356", "evaluations[0].method: unknown method \"FEMA356\"; allowed: FEMA440, ATC-40, EC8/OPCM, NTC2008, NTC2018"},
-    {"evaluations", "FEMA440", "ATC-40", "evaluations[0].procedure: unknown procedure \"C\"; allowed: A, B"},
     {"evaluations", "FEMA440", "NTC2008", "evaluations[0].procedure: only ATC-40 and FEMA440 have procedures"},
     {"evaluations", "\"C\"", "\"D\"", "evaluations[0].procedure: unknown procedure \"D\"; allowed: A, B, C"},
     {"evaluations", "\"behavior\": 3", "\"behavior\": 4", "evaluations[0].behavior: the behavior is 0, 1, 2 or 3"},
     {"evaluations", "2.5", "-1", "evaluations[0].elastic_damping: damping is 0 to 100 per cent"},
-    {"evaluations", "2.5", "101", "evaluations[0].elastic_damping: damping is 0 to 100 per cent"},
-    {"evaluations", "[10, 1, 40", "[0, 1, 40", "evaluations[0].user_damping: both beta must be above 0"},
-    {"evaluations", "[10, 1, 40", "[10, 1, 9", "evaluations[0].user_damping: beta2 is below beta1"},
-    {"evaluations", "[10, 1, 40", "[40, 1, 40", "OK"},
     {"evaluations", "[10, 1, 40, 0.7]", "[10, 1, 40]", "evaluations[0].user_damping: 3 values, expected 4"},
+    {"evaluations", "2.5", "101", "evaluations[0].elastic_damping: damping is 0 to 100 per cent"},
     {"evaluations", "\"drift_kind\": 2", "\"drift_kind\": 3", "evaluations[0].drift_kind: the drift kind is 1 or 2"},
     {"evaluations", "\"plot_type\": 4", "\"plot_type\": 9", "evaluations[0].plot_type: the plot type is 0 to 8"},
     {"evaluations", "\"ntc\"", "\"opcm\"", "evaluations[0].bilinear.rule: unknown bilinear rule \"opcm\"; allowed: ec8, ntc, masonry"},
     {"evaluations", "0.75", "0", "evaluations[0].bilinear.secant: the fraction is above 0 and up to 1"},
     {"evaluations", "0.8", "1.1", "evaluations[0].bilinear.drop: the fraction is above 0 and up to 1"},
-    {"evaluations", "\"iterate\": true", "\"iterate\": 1", "evaluations[0].bilinear.iterate: expected true or false, found a number"},
 };
 // clang-format on
 
@@ -235,16 +174,12 @@ TEST(CaseFile, NamesLineAndColumnOfTextThatIsNoJson)
         const char* start;
     };
     const T_ROW rows[] = {
-        {"empty", "", "case.json: the file is empty"},
-        {"blank", " \n\t\r\n", "case.json: the file is empty"},
         {"mark", "\xEF\xBB\xBF{}",
          "case.json: line 1, column 1: the text starts with a byte order"},
         {"not a number", "{\n \"gravity\": NaN}", "case.json: line 2, column 13: "},
-        {"infinity", "{\"gravity\": Infinity}", "case.json: line 1, column 13: "},
         {"overflow", "{\"gravity\": 1e999}",
          "case.json: line 1, column 17: number overflow parsing '1e999'"},
         {"truncated", AllMembers().substr(0, 60), "case.json: line 3, column "},
-        {"comment", "{ // no\n}", "case.json: line 1, column 3: "},
         {"two documents", "{}\n{}", "case.json: line 2, column 1: "},
         {"a zero byte", std::string("{}\n\0{", 5), "case.json: line 2, column 1: a zero byte"},
         {"bad UTF-8", "{\"title\": \"\xff\"}", "case.json: line 1, column 12: "},
@@ -253,31 +188,6 @@ TEST(CaseFile, NamesLineAndColumnOfTextThatIsNoJson)
     };
     for (const T_ROW& row : rows)
         EXPECT_EQ(0U, RefusalOf(row.text).find(row.start)) << row.label << RefusalOf(row.text);
-}
-
-TEST(CaseFile, RefusesDeepNestingWithoutRunningOutOfStack)
-{
-    const std::string deep = "{\n\"nodes\": " + std::string(200000, '[');
-    EXPECT_EQ("case.json: line 2, column 73: nested deeper than 64 levels", RefusalOf(deep));
-    std::string objects;
-    for (int i = 0; i < 200000; ++i)
-        objects += "{\"[[\\\"\":"; // brackets and quotes inside a text don't count
-    EXPECT_EQ("case.json: line 1, column 513: nested deeper than 64 levels", RefusalOf(objects));
-    EXPECT_EQ("case.json: line 1, column 65: nested deeper than 64 levels",
-              RefusalOf(std::string(65, '[') + std::string(65, ']')));
-    const std::string limit = std::string(64, '[') + std::string(64, ']');
-    EXPECT_EQ("case.json: expected an object, found an array", RefusalOf(limit));
-}
-
-TEST(CaseFile, LeavesTablesOutThatMayBeLeftOut)
-{
-    const std::string text = "{\"format\": \"qm-rps case 1\", "
-                             "\"units\": {\"force\": \"N\", \"length\": \"mm\"}, \"nodes\": []}";
-    const T_MODEL_CONTENT content = ParseGood(text);
-    T_MODEL expected;
-    expected.styp.units = {FORCE_UNIT::N, LENGTH_UNIT::mm};
-    EXPECT_EQ(expected, content.model);
-    ExpectSame(content, ParseGood(PrintGood(content)));
 }
 
 TEST(CaseFile, ConvertsToSi)
@@ -300,50 +210,9 @@ TEST(CaseFile, ConvertsToSi)
     EXPECT_EQ(0.01, rz.displacement.at(7)[0]);
 }
 
-TEST(CaseFile, KeepsWhichMembersWereGiven)
-{
-    const T_MODEL m = ParseGood(AllMembers()).model;
-    const T_EVAL_D& e1 = m.evaluations.at(1);
-    EXPECT_EQ('C', e1.procedure);
-    EXPECT_EQ((std::array{10.0, 1.0, 40.0, 0.7}), e1.userDamping);
-    EXPECT_EQ(true, e1.alphaInPercent);
-    const T_EVAL_D& e2 = m.evaluations.at(2);
-    EXPECT_EQ(PUSH_METHOD::Ntc2018, e2.method);
-    EXPECT_FALSE(e2.procedure || e2.behavior || e2.elasticDamping || e2.driftKind || e2.plotType);
-    EXPECT_EQ(T_EVAL_BILINEAR{}, e2.bilinear);
-    const auto& ntc = std::get<T_SPFC_NTC>(m.spectra.at(4).data);
-    EXPECT_EQ(3, ntc.topography);
-    EXPECT_FALSE(ntc.states[0] || ntc.states[3]);
-    EXPECT_EQ((std::array{-2, 2, 3}), m.poverSteps.at(1).ntc);
-    EXPECT_EQ(0U, m.poverSteps.count(2));
-}
-
 TEST(CaseFile, PrintsTheTextThatItReadWhenThatIsInPrintedForm)
 {
     EXPECT_EQ(AllMembers(), PrintGood(ParseGood(AllMembers())));
-}
-
-TEST(CaseFile, IsTheSameAfterPrintAndRead)
-{
-    for (const char* name : {"elastic_all_methods", "frame_hardening_kN", "frame_softening_kips"}) {
-        SCOPED_TRACE(name);
-        T_MODEL_CONTENT content;
-        T_FILE_ERROR error;
-        ASSERT_EQ(1, CCaseFile::Read(kCases + name + ".json", content, error)) << error.text;
-        EXPECT_EQ(1U, content.results.size());
-        const std::string text = PrintGood(content);
-        const T_MODEL_CONTENT again = ParseGood(text);
-        ExpectSame(content, again);
-        EXPECT_EQ(text, PrintGood(again));
-    }
-}
-
-TEST(CaseFile, KeepsTheDigitsOfTheFile)
-{
-    const std::string text = PrintGood(ParseGood(TextOf(kCases + "frame_softening_kips.json")));
-    for (const char* number :
-         {"2.6473775", "1.035643", "132.94", "0.104012472602", "78.9548619075"})
-        EXPECT_NE(std::string::npos, text.find(number)) << number;
 }
 
 /// The shortest text of all doubles that are stored as the same value is not longer than the text
@@ -371,49 +240,6 @@ TEST(CaseFile, PrintsNoMoreDigitsThanTheFileHad)
     EXPECT_EQ("-0.0", NumberText(-0.0));
 }
 
-TEST(CaseFile, WrapsLongArraysOfNumbers)
-{
-    std::istringstream lines(PrintGood(ParseGood(TextOf(kCases + "frame_hardening_kN.json"))));
-    std::size_t longest = 0;
-    for (std::string line; std::getline(lines, line);) {
-        const std::size_t first = line.find_first_not_of(' ');
-        if (line.find_first_not_of("0123456789.-e, ") == std::string::npos)
-            longest = std::max(longest, line.size() * (first > 0));
-    }
-    EXPECT_GT(longest, 90U); // the next number would not have fitted
-    EXPECT_LE(longest, 100U);
-}
-
-/// Random doubles of all sizes, some as a solver would leave them in the store (mass), some as a
-/// file with all digits gives them (xyz).
-TEST(CaseFile, IsStableForAnyStoredNumberInAnyUnits)
-{
-    std::mt19937_64 random(20240517);
-    for (int unit = 0; unit < 35; ++unit) {
-        const T_UNITS units{static_cast<FORCE_UNIT>(unit % 7), static_cast<LENGTH_UNIT>(unit / 7)};
-        T_MODEL_CONTENT content;
-        content.model.styp.units = units;
-        for (int id = 1; id <= 300; ++id) {
-            T_NODE_D& node = content.model.nodes[id];
-            node.id = id;
-            for (std::size_t i = 0; i < 3; ++i) {
-                const int exponent = static_cast<int>(random() % 200) - 160;
-                node.mass[i] = std::ldexp(static_cast<double>(random()), exponent);
-                node.xyz[i] = ToSi(id % 2 ? -node.mass[i] : node.mass[i], units, kDimLength);
-            }
-        }
-        const std::string text = PrintGood(content);
-        const T_MODEL_CONTENT again = ParseGood(text);
-        EXPECT_EQ(text, PrintGood(again));
-        for (const auto& [id, node] : content.model.nodes) {
-            const T_NODE_D& read = again.model.nodes.at(id);
-            EXPECT_EQ(node.xyz, read.xyz);
-            for (std::size_t i = 0; i < 3; ++i) // at most one unit in the last place
-                EXPECT_LE(std::fabs(read.mass[i] / node.mass[i] - 1.0), 2.3e-16);
-        }
-    }
-}
-
 TEST(CaseFile, RefusesToPrintWhatCouldNotBeRead)
 {
     const T_MODEL_CONTENT good = ParseGood(AllMembers());
@@ -421,13 +247,10 @@ TEST(CaseFile, RefusesToPrintWhatCouldNotBeRead)
         const char* message;
         void (*spoil)(T_MODEL_CONTENT&);
     };
-    constexpr double inf = std::numeric_limits<double>::infinity();
     static constexpr double nan = std::numeric_limits<double>::quiet_NaN();
     const T_ROW rows[] = {
         {"nodes[1].xyz: item [1] is not a finite number",
          [](T_MODEL_CONTENT& c) { c.model.nodes.at(2).xyz[1] = nan; }},
-        {"modes[0].period: the value is not a finite number",
-         [](T_MODEL_CONTENT& c) { c.model.modes.at(1).period = inf; }},
         {"nodes[0].xyz: item [0] is not a finite number", // 1.7e308 m is no number of inches
          [](T_MODEL_CONTENT& c) { c.model.nodes.at(1).xyz[0] = 1.7e308; }},
         {"modes[0]: mode numbers must run 1, 2, 3, ...: found 3",
@@ -442,9 +265,6 @@ TEST(CaseFile, RefusesToPrintWhatCouldNotBeRead)
         {"pushover[1].steps: the load case \"RZ\" has no results, which a case file can't leave "
          "out",
          [](T_MODEL_CONTENT& c) { c.results.erase(2); }},
-        {"pushover[1].steps: the load case \"RZ\" has no results, which a case file can't leave "
-         "out",
-         [](T_MODEL_CONTENT& c) { c.results[2] = MakePushResult({}); }},
         {"pushover[0].steps.displacement.\"2\": 1 values, expected 2",
          [](T_MODEL_CONTENT& c) {
              c.results[1] = MakePushResult({{1, 2}, {3, 4}, {{2, {1}}, {7, {1, 2}}}});
@@ -460,23 +280,6 @@ TEST(CaseFile, RefusesToPrintWhatCouldNotBeRead)
         EXPECT_EQ(FILE_FAULT::BadInput, error.fault);
         EXPECT_EQ("as it was", text);
     }
-}
-
-TEST(CaseFile, WritesAndReadsAFile)
-{
-    const std::string path = testing::TempDir() + "casefile_test_written.json";
-    const T_MODEL_CONTENT content = ParseGood(AllMembers());
-    T_FILE_ERROR error;
-    ASSERT_EQ(1, CCaseFile::Write(path, content, error)) << error.text;
-    T_MODEL_CONTENT again;
-    ASSERT_EQ(1, CCaseFile::Read(path, again, error)) << error.text;
-    ExpectSame(content, again);
-    EXPECT_EQ(0, CCaseFile::Write("/no/such/folder/x.json", content, error));
-    EXPECT_EQ(FILE_FAULT::NoAccess, error.fault);
-    EXPECT_EQ(0, CCaseFile::Read("/no/such/file.json", again, error));
-    EXPECT_EQ(FILE_FAULT::NoAccess, error.fault);
-    EXPECT_EQ(0U, error.text.find("/no/such/file.json: ")) << error.text;
-    ExpectSame(content, again);
 }
 
 } // namespace

@@ -4,7 +4,6 @@
 #include <fstream>
 #include <gtest/gtest.h>
 #include <sys/resource.h>
-#include <sys/stat.h>
 #include <unistd.h>
 
 namespace fs = std::filesystem;
@@ -53,39 +52,6 @@ private:
     rlimit m_before{};
 };
 
-TEST_F(FileCtrl, DropsTheLastExtensionOnly)
-{
-    const char* const rows[][2] = {
-        {"/a/b/frame.v2.qmdb", "/a/b/frame.v2"},
-        {"frame.json", "frame"},
-        {"/a.b/frame", "/a.b/frame"},
-        {"/a/.hidden", "/a/.hidden"},
-        {"", ""},
-    };
-    for (const auto& row : rows)
-        EXPECT_EQ(row[1], CFileCtrl::GetFilePathAndNameWithoutExtension(row[0]));
-}
-
-TEST_F(FileCtrl, WritesReplacesAndReadsBack)
-{
-    const std::string big(3'000'001, 'x');
-    const std::string odd("line\r\n\0\xff", 8);
-    std::string text;
-    for (const std::string& whole : {big, std::string(), odd}) {
-        ASSERT_EQ(1, CFileCtrl::WriteWholeFile(m_path, whole, m_error)) << m_error.text;
-        ASSERT_EQ(1, CFileCtrl::ReadWholeFile(m_path, text, m_error)) << m_error.text;
-        EXPECT_EQ(whole, text);
-    }
-    EXPECT_EQ(1U, FileCount()); // no temporary file
-}
-
-TEST_F(FileCtrl, ReadsAFileThatTellsNoSize)
-{
-    std::string text;
-    ASSERT_EQ(1, CFileCtrl::ReadWholeFile("/proc/self/stat", text, m_error)) << m_error.text;
-    EXPECT_EQ(0U, text.find(std::to_string(getpid())));
-}
-
 TEST_F(FileCtrl, KeepsTheOldFileWhenTheDiskIsFull)
 {
     ASSERT_EQ(1, CFileCtrl::WriteWholeFile(m_path, "old", m_error));
@@ -111,14 +77,6 @@ TEST_F(FileCtrl, KeepsLinkAndPermissions)
     EXPECT_TRUE(fs::is_symlink(link));
     EXPECT_EQ("new", TextOf(m_path));
     EXPECT_EQ(fs::perms(0640), fs::status(m_path).permissions());
-}
-
-TEST_F(FileCtrl, TakesOverATemporaryFileOfADeadProcess)
-{
-    std::ofstream(m_path + ".tmp-" + std::to_string(getpid())) << "half";
-    ASSERT_EQ(1, CFileCtrl::WriteWholeFile(m_path, "new", m_error)) << m_error.text;
-    EXPECT_EQ("new", TextOf(m_path));
-    EXPECT_EQ(1U, FileCount());
 }
 
 TEST_F(FileCtrl, RefusesWhatIsNoFile)

@@ -1,7 +1,5 @@
 #include "qm_db/mathfunc.h"
 
-#include "qm_db/compfunc.h"
-
 #include <gtest/gtest.h>
 #include <limits>
 
@@ -22,21 +20,17 @@ const T_CASE kCases[] = {
     { "plain",            {0, 0}, {2, 2},       {0, 2}, {4, 0},          1, 1.0 / 3, {4.0 / 3, 4.0 / 3} },
     { "radial to 1e48",   {0, 0}, {kFar, kFar}, {0, 2}, {4, 0},          1, 1.0 / 3, {4.0 / 3, 4.0 / 3} },
     { "axes of two units",{0, 0}, {2e6, 2e-6},  {0, 2e-6}, {4e6, 0},     1, 1.0 / 3, {4e6 / 3, 4e-6 / 3} },
-    { "vertical",         {3, 0}, {3, kFar},    {2, 1}, {4, 2},          1, 0.5,     {3, 1.5} },
     { "touch at its end", {0, 0}, {1, 0},       {1, 0}, {1, 5},          1, 0.0,     {1, 0} },
     { "inside 1e-9",      {0, 0}, {1 - 5e-10, 0}, {1, -1}, {1, 1},       1, 0.5,     {1, 0} },
     { "clamped to Q",     {0, 0}, {2, 0},       {1, 5e-10}, {1, 1 + 5e-10}, 1, 0.0,  {1, 5e-10} },
     { "outside 1e-9",     {0, 0}, {1 - 5e-9, 0}, {1, -1}, {1, 1},        0, 0, {} },
     { "Q ends before",    {0, 0}, {2, 0},       {1, 5e-9}, {1, 1 + 5e-9}, 0, 0, {} },
     { "beyond P",         {0, 0}, {1, 1},       {0, 4}, {4, 0},          0, 0, {} },
-    { "behind P",         {1, 1}, {2, 2},       {0, 1}, {1, 0},          0, 0, {} },
-    { "parallel",         {0, 0}, {1, 1},       {0, 1}, {1, 2},          0, 0, {} },
     { "parallel, 5e-10",  {0, 0}, {1, 1},       {0, 0}, {1, 1 + 5e-10},  0, 0, {} },
     { "not parallel",     {0, 0}, {1, 1},       {0, 0}, {1, 1 + 5e-8},   1, 0, {0, 0} },
     { "on one line",      {0, 0}, {2, 2},       {1, 1}, {3, 3},          0, 0, {} },
     { "a point",          {1, 1}, {1, 1},       {0, 0}, {2, 2},          0, 0, {} },
     { "not a number",     {0, 0}, {kNan, 1},    {0, 2}, {4, 0},          0, 0, {} },
-    { "not a number 2",   {kNan, 0}, {2, 2},    {0, 2}, {4, 0},          0, 0, {} },
 };
 // clang-format on
 
@@ -63,14 +57,4 @@ TEST(MathFunc, TheCallersLargerToleranceCounts)
     const T_POINT2 P1{0, 0}, P2{0.95, 0}, Q1{1, -1}, Q2{1, 1};
     EXPECT_EQ(0, CMathFunc::mathIntersectLine2(P1, P2, Q1, Q2, 0.01, param, p));
     EXPECT_EQ(1, CMathFunc::mathIntersectLine2(P1, P2, Q1, Q2, 0.1, param, p));
-}
-
-TEST(CompFunc, EqualMeansWithinTheTolerance)
-{
-    EXPECT_EQ(0, CCompFunc::CompRealTol(1.0, 1.25, 0.25)); // the tolerance itself is equal
-    EXPECT_EQ(0, CCompFunc::CompRealTol(1.25, 1.0, 0.25));
-    EXPECT_EQ(-1, CCompFunc::CompRealTol(1.0, 1.25, 0.2499));
-    EXPECT_EQ(1, CCompFunc::CompRealTol(1.25, 1.0, 0.2499));
-    EXPECT_EQ(0, CCompFunc::CompRealTol(3.0, 3.0, 0.0));
-    EXPECT_EQ(-1, CCompFunc::CompRealTol(-1e-9, 0.0, 1e-10));
 }

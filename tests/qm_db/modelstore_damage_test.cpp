@@ -110,19 +110,6 @@ TEST_F(ModelStoreDamage, EveryFlippedBitOfAResultIsFound)
     }
 }
 
-TEST_F(ModelStoreDamage, FlippedBitInARecordIsFoundByItsTable)
-{
-    ASSERT_NE(std::string::npos, m_bytes.find("kips"));
-    ASSERT_NE(std::string::npos, m_bytes.rfind("1F"));
-    Poke(m_bytes.find("kips"), 'K'); // no unit of that name, and not the stored text either
-    ExpectRefused("unit");
-    Poke(m_bytes.find("kips"), 'k');
-    Poke(m_bytes.rfind("1F"), '2'); // a storey's name: a valid text all the same
-    ExpectRefused("storey");
-    const std::string table = MMSGFunction::Format("IDS_QM_DB_DAMAGE_TABLE", {"storeys"});
-    EXPECT_EQ(Message("IDS_QM_DB_FILE_DAMAGED", table), m_error.text);
-}
-
 TEST_F(ModelStoreDamage, CutFilesAreRefused)
 {
     const auto size = static_cast<std::int64_t>(m_bytes.size());
@@ -137,36 +124,6 @@ TEST_F(ModelStoreDamage, CutFilesAreRefused)
     }
     WriteBytes(m_path, m_bytes + std::string(4096, '\0'));
     ExpectRefused("longer");
-}
-
-TEST_F(ModelStoreDamage, EmptyForeignAndNewerFilesSayWhatTheyAre)
-{
-    std::string newer = m_bytes;
-    newer[63] = 7; // user_version, last byte
-    std::string other = m_bytes;
-    other[68] = 'x'; // application id
-    std::string wal = m_bytes;
-    wal[18] = wal[19] = 2;
-    const struct {
-        const char* label;
-        std::string bytes;
-        std::string text;
-    } cases[] = {
-        {"empty", "", Message("IDS_QM_DB_FILE_EMPTY")},
-        {"text", "{\"format\": \"qm-rps case 1\"}", Message("IDS_QM_DB_FILE_FOREIGN")},
-        {"one byte", "x", Message("IDS_QM_DB_FILE_FOREIGN")},
-        {"large text", std::string(10000, 'a'), Message("IDS_QM_DB_FILE_FOREIGN")},
-        {"other application", other, Message("IDS_QM_DB_FILE_OTHER_APP")},
-        {"newer", newer, Message("IDS_QM_DB_FILE_NEWER", "7", "2")},
-        {"wal", wal,
-         Message("IDS_QM_DB_FILE_DAMAGED", MMSGFunction::GetValue("IDS_QM_DB_DAMAGE_HEADER"))},
-    };
-    for (const auto& c : cases) {
-        WriteBytes(m_path, c.bytes);
-        ExpectRefused(c.label);
-        EXPECT_EQ(c.text, m_error.text) << c.label;
-        EXPECT_EQ(c.bytes, BytesOf(m_path)) << c.label;
-    }
 }
 
 TEST_F(ModelStoreDamage, OtherTablesUnderOurMarkAreRefused)
@@ -186,15 +143,12 @@ TEST_F(ModelStoreDamage, OtherTablesUnderOurMarkAreRefused)
         {"another table", "CREATE TABLE extra(a)", true},
         {"a trigger", kTrigger, true},
         {"record missing", "DELETE FROM evaluations WHERE key = 2", false},
-        {"nodes missing", "DELETE FROM arrays WHERE owner = 'nodes' AND name = 'mass'", true},
         {"node places missing", "DELETE FROM arrays WHERE owner = 'nodes' AND name = 'xyz'", true},
         {"not a number", kNan, true},
         {"block missing", "DELETE FROM result_blocks WHERE part = 3 AND step = 1", true},
         {"blocks without a head", "DELETE FROM results WHERE key = 3", true},
         {"blocks reversed", kReversed, true},
-        {"model missing", "DELETE FROM model", true},
         {"unknown unit", "UPDATE model SET force_unit = 'stone'", true},
-        {"unknown method", "UPDATE evaluations SET method = 9", true},
         {"sum missing", "DELETE FROM checksums WHERE name = 'modes'", false},
     };
     for (const auto& c : cases) {
@@ -214,22 +168,6 @@ TEST_F(ModelStoreDamage, JournalBesideTheFileIsLeftAlone)
     ASSERT_EQ(1, Open()) << m_error.text;
     EXPECT_TRUE(SameContent(RichContent(), m_content));
     EXPECT_TRUE(journal == BytesOf(m_path + "-journal"));
-}
-
-TEST_F(ModelStoreDamage, MissingFilesAndFoldersAreNoAccess)
-{
-    ASSERT_TRUE(fs::remove(m_path));
-    EXPECT_EQ(0, Open());
-    EXPECT_EQ(FILE_FAULT::NoAccess, m_error.fault);
-    EXPECT_EQ(Message("IDS_QM_DB_FILE_CANT_OPEN", "No such file or directory"), m_error.text);
-    EXPECT_EQ(0, CModelStore().Open(m_path, OPEN_MODE::Edit, m_content, m_error));
-    EXPECT_FALSE(fs::exists(m_path));
-
-    fs::create_directory(m_path);
-    EXPECT_EQ(0, Open());
-    EXPECT_EQ(FILE_FAULT::NoAccess, m_error.fault);
-    EXPECT_EQ(0, CModelStore().Save(m_path, RichContent(), m_error));
-    EXPECT_EQ(FILE_FAULT::NoAccess, m_error.fault);
 }
 
 /// Over 16 MiB: blocks are checked when they are read, and only those that are read.

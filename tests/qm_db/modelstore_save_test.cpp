@@ -3,12 +3,9 @@
 #include "qm_db/modelstore.h"
 
 #include <csignal>
-#include <ctime>
-#include <fcntl.h>
 #include <filesystem>
 #include <gtest/gtest.h>
 #include <limits>
-#include <sys/file.h>
 #include <sys/resource.h>
 #include <sys/stat.h>
 #include <sys/wait.h>
@@ -18,17 +15,6 @@ namespace fs = std::filesystem;
 using zql::lib::MMSGFunction;
 
 namespace {
-
-/// A source whose every read of displacements fails.
-class CBrokenResult : public IPushResult {
-public:
-    int StepCount() const override { return 1; }
-    std::vector<int> NodeIds() const override { return {1}; }
-    bool HasNode(int node) const override { return node == 1; }
-    int ReadLoadFactors(std::vector<double>& out) override { return out = {1.0}, 1; }
-    int ReadBaseReactions(std::vector<double>& out) override { return out = {1.0}, 1; }
-    int ReadDisplacements(int, std::vector<double>& out) override { return out.clear(), 0; }
-};
 
 class ModelStoreSave : public testing::Test {
 protected:
@@ -68,13 +54,9 @@ TEST_F(ModelStoreSave, NumbersThatAreNotFiniteAreRefused)
     } cases[] = {
         {"model 1 gravity", [](auto& c, double v) { c.model.styp.gravity = v; }},
         {"nodes 0 xyz", [](auto& c, double v) { c.model.nodes[2].xyz[1] = v; }},
-        {"nodes 0 mass", [](auto& c, double v) { c.model.nodes[2].mass[2] = v; }},
-        {"storeys 1 height", [](auto& c, double v) { c.model.storeys[1].height = v; }},
         {"modes 2 shape", [](auto& c, double v) { c.model.modes[2].shape[1][5] = v; }},
         {"spectra 9 Sa",
          [](auto& c, double v) { std::get<T_SPFC_USER>(c.model.spectra[9].data).Sa[0] = v; }},
-        {"evaluations 2 bilinear_drop",
-         [](auto& c, double v) { c.model.evaluations[2].bilinear->drop = v; }},
         {"results 1 load_factor",
          [](auto& c, double v) {
              c.results[1] = MakePushResult({{v}, {1}, {}});
@@ -105,8 +87,6 @@ TEST_F(ModelStoreSave, ResultsThatDoNotFitAreRefused)
               m_error.text);
     content.results[1] = MakePushResult({{1, 2}, {1}, {}});
     ExpectRefused(content, FILE_FAULT::BadInput, "base reactions");
-    content.results[1] = std::make_shared<CBrokenResult>();
-    ExpectRefused(content, FILE_FAULT::BadInput, "source");
 }
 
 TEST_F(ModelStoreSave, ModelThatReadsBackDifferentlyIsRefused)
@@ -143,15 +123,6 @@ TEST_F(ModelStoreSave, FullDiskLeavesTheOldFileAlone)
     EXPECT_EQ(1, CModelStore().Save(m_path, large, m_error)) << m_error.text; // it was the limit
 }
 
-TEST_F(ModelStoreSave, PathThatCantBeWrittenIsRefused)
-{
-    const std::string nowhere = m_folder.File("none/frame.qmdb");
-    EXPECT_EQ(0, CModelStore().Save(nowhere, RichContent(), m_error));
-    EXPECT_EQ(FILE_FAULT::NoAccess, m_error.fault);
-    EXPECT_NE(std::string::npos, m_error.text.find(nowhere));
-    ExpectUntouched("folder missing");
-}
-
 TEST_F(ModelStoreSave, KeepsPermissionsAndLinks)
 {
     const std::string link = m_folder.File("link.qmdb");
@@ -171,45 +142,6 @@ TEST_F(ModelStoreSave, KeepsPermissionsAndLinks)
     ::umask(before);
     EXPECT_EQ(fs::perms(0640), fs::status(fresh).permissions());
     EXPECT_FALSE(m_before == BytesOf(m_path));
-}
-
-/// Process id of a process that has ended.
-pid_t GonePid()
-{
-    const pid_t child = ::fork();
-    if (child == 0) ::_exit(0);
-    ::waitpid(child, nullptr, 0);
-    return child;
-}
-
-TEST_F(ModelStoreSave, EditingSweepsOnlyStaleTemporaryFiles)
-{
-    const std::string gone = "frame.qmdb.tmp-" + std::to_string(GonePid()) + "-1";
-    const std::string alive = "frame.qmdb.tmp-" + std::to_string(::getpid());
-    // stale: the process is gone, or the file is old; kept: fresh, locked, or not ours
-    const std::vector<std::string> stale{gone, alive + "-91"};
-    std::vector<std::string> kept{"frame.qmdb",        alive + "-92",       alive + "-93",
-                                  gone + "x",          "frame.qmdb.tmp-1x", "frame.qmdb.tmp-",
-                                  "other.qmdb.tmp-1-1"};
-    for (const auto& list : {stale, kept}) {
-        for (const std::string& name : list) {
-            if (name != "frame.qmdb") WriteBytes(m_folder.File(name), "x");
-        }
-    }
-    const auto hourAgo = fs::file_time_type::clock::now() - std::chrono::hours(1);
-    fs::last_write_time(m_folder.File(alive + "-91"), hourAgo);
-    fs::last_write_time(m_folder.File(alive + "-93"), hourAgo);
-    const int locked = ::open(m_folder.File(alive + "-93").c_str(), O_RDONLY);
-    ASSERT_EQ(0, ::flock(locked, LOCK_EX));
-
-    T_MODEL_CONTENT content;
-    const std::size_t before = m_folder.Names().size();
-    ASSERT_EQ(1, CModelStore().Open(m_path, OPEN_MODE::ReadOnly, content, m_error));
-    EXPECT_EQ(before, m_folder.Names().size()); // reading touches nothing
-    ASSERT_EQ(1, CModelStore().Open(m_path, OPEN_MODE::Edit, content, m_error)) << m_error.text;
-    std::sort(kept.begin(), kept.end());
-    EXPECT_EQ(kept, m_folder.Names());
-    ::close(locked);
 }
 
 } // namespace

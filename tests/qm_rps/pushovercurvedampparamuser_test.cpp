@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 #include <limits>
+#include <vector>
 
 TEST(CurveDampParamUser, AcceptsAscendingPositiveDampingAndRefusesTheRest)
 {
@@ -23,31 +24,18 @@ TEST(CurveDampParamUser, AcceptsAscendingPositiveDampingAndRefusesTheRest)
     };
     for (const T_CASE& c : cases) {
         CPushOverCurveDampParamUser dlg;
-        dlg.m_beta1 = c.beta1;
-        dlg.m_kappa1 = c.kappa1;
-        dlg.m_beta2 = c.beta2;
-        dlg.m_kappa2 = c.kappa2;
+        const T_DAMP_PARAM in{2, 3.0, c.beta1, c.kappa1, c.beta2, c.kappa2};
+        dlg.Data2Dlg(in);
+        if (c.accepted) {
+            T_DAMP_PARAM out{1, 4.0, 0, 0, 0, 0};
+            dlg.Dlg2Data(out);
+            const std::vector<double> kept{1.0, 4.0, c.beta1, c.kappa1, c.beta2, c.kappa2};
+            EXPECT_EQ(kept, (std::vector<double>{1.0 * out.behaviorType, out.elasticPct, out.beta1,
+                                                 out.kappa1, out.beta2, out.kappa2}));
+        }
         EXPECT_EQ(c.accepted, dlg.OnOK()) << c.label;
         ASSERT_EQ(c.accepted ? 0u : 1u, dlg.Messages().size()) << c.label;
         for (const zql::frx::T_MESSAGE& m : dlg.Messages())
             EXPECT_EQ("IDS_PUSHOVER_Wrong_Input_", m.key) << c.label;
     }
-}
-
-TEST(CurveDampParamUser, CarriesTheFourValuesInTheirOrderAndNothingElse)
-{
-    CPushOverCurveDampParamUser dlg;
-    dlg.Data2Dlg({2, 3.0, 10, 0.9, 30, 0.5});
-    EXPECT_EQ(10, dlg.m_beta1);
-    EXPECT_EQ(0.9, dlg.m_kappa1);
-    EXPECT_EQ(30, dlg.m_beta2);
-    EXPECT_EQ(0.5, dlg.m_kappa2);
-    T_DAMP_PARAM out{1, 4.0, 0, 0, 0, 0};
-    dlg.Dlg2Data(out);
-    EXPECT_EQ(1, out.behaviorType);
-    EXPECT_EQ(4.0, out.elasticPct);
-    EXPECT_EQ(10, out.beta1);
-    EXPECT_EQ(0.9, out.kappa1);
-    EXPECT_EQ(30, out.beta2);
-    EXPECT_EQ(0.5, out.kappa2);
 }

@@ -2,7 +2,6 @@
 
 #include <cmath>
 #include <gtest/gtest.h>
-#include <limits>
 #include <numbers>
 
 namespace {
@@ -24,10 +23,8 @@ struct T_CASE {
 // clang-format off
 const T_CASE kCases[] = {
     { "long",               0.40, 0.5,    true,  0.10,  0.10,  {},     false },
-    { "long, Se = 0",       0.00, 0.5,    true,  0.00,  0.00,  {},     false },
     { "qu below 1",         0.10, 2.0,    true,  0.025, 0.025, 0.5,    false },
     { "qu = 1",             0.20, 2.0,    true,  0.05,  0.05,  1.0,    false },
-    { "qu just above 1",    0.2002, 1.001, true, 0.05005, 0.05005005, 1.001, false },
     { "qu = 2",             0.40, 2.0,    true,  0.10,  0.15,  2.0,    false }, // 0.05 (1 + 1*2)
     { "at 3 det",           0.40, 5.0,    true,  0.10,  0.30,  2.0,    false }, // 0.05 (1 + 1*5)
     { "capped",             0.60, 10.0,   true,  0.15,  0.45,  3.0,    true },  // 0.05 * 21 > 0.45
@@ -46,20 +43,14 @@ struct T_STEP_CASE {
 const T_STEP_CASE kSteps[] = {
     { "before the first",   {0.1, 1, 2, 4}, 0.05, kStepNone },
     { "at the first",       {0.1, 1, 2, 4}, 0.1,  0 },
-    { "lower end",          {0.1, 1, 2, 4}, 1.4,  1 },
     { "midpoint",           {0.1, 1, 2, 4}, 1.5,  1 },
     { "midpoint, rounding", {0.1, 1, 2, 4}, 1.5 + 2e-11, 1 },
-    { "upper end",          {0.1, 1, 2, 4}, 1.6,  2 },
     { "upper, just past",   {0.1, 1, 2, 4}, 1.5 + 1e-9, 2 },
-    { "on a step",          {0.1, 1, 2, 4}, 2.0,  2 },
     { "on it, rounding",    {0.1, 1, 2, 4}, 2.0 - 5e-11, 2 },
-    { "last interval",      {0.1, 1, 2, 4}, 3.9,  3 },
     { "equal to the last",  {0.1, 1, 2, 4}, 4.0,  3 },
     { "nearly the last",    {0.1, 1, 2, 4}, 4.0 - 5e-11, kStepNone }, // tolerance, then plain ==
     { "beyond",             {0.1, 1, 2, 4}, 4.1,  kStepNone },
-    { "none",               {0.1, 1, 2, 4}, -1.0, kStepNone },
     { "turns back",         {0, 2, 1, 3},   1.2,  2 }, // 1 first, then overwritten
-    { "turns back, once",   {0, 2, 1, 3},   0.9,  0 },
     { "repeated point",     {0, 1, 1, 2},   1.0,  2 },
     { "one point",          {1},            1.0,  0 },
     { "no point",           {},             1.0,  kStepNone },
@@ -78,7 +69,6 @@ struct T_DROP_CASE {
 // clang-format off
 const T_DROP_CASE kDrops[] = {
     { "falls",             {0, 10, 8, 4, 9}, 1, 7.0,  0.0, 2.25,    2 },
-    { "falls, nearer end", {0, 10, 8, 4, 9}, 1, 5.0,  0.0, 2.75,    3 },
     { "midpoint",          {0, 10, 8, 4, 9}, 1, 6.0,  0.0, 2.5,     2 },
     { "at a point",        {0, 10, 8, 4, 9}, 1, 8.0,  0.0, 2.0,     2 },
     { "rises",             {0, 10, 8, 4, 9}, 1, 7.0,  3.0, 3.6,     4 },
@@ -87,7 +77,6 @@ const T_DROP_CASE kDrops[] = {
     { "before the peak",   {0, 10, 8, 4, 9}, 3, 7.0,  0.0, 3.6,     4 },
     { "equal ordinates",   {0, 10, 5, 5, 5}, 1, 5.0,  2.0, 2.0,     2 },
     { "nowhere",           {0, 10, 8, 4, 9}, 1, 3.0,  0.0, 0.0,     kStepNone },
-    { "du beyond",         {0, 10, 8, 4, 9}, 1, 7.0,  5.0, 0.0,     kStepNone },
 };
 // clang-format on
 
@@ -120,7 +109,6 @@ TEST(TargetDisp, EqualPeriodsAreTheLongBranch)
 
 TEST(TargetDisp, NoTargetHasItsReason)
 {
-    const double nan = std::numeric_limits<double>::quiet_NaN();
     const auto code = [](const T_BILINEAR& b, double Se, double Tc) {
         const T_TARGET_DISP t = CalcTargetDisp(b, kG, Se, Tc, true);
         EXPECT_FALSE(t.found);
@@ -129,12 +117,9 @@ TEST(TargetDisp, NoTargetHasItsReason)
     EXPECT_EQ(PUSH_OUTCOME::ZeroDemand, code(kYield, 0.0, 2.0));
     EXPECT_EQ(PUSH_OUTCOME::NoTarget, code({0.0, 0.2, 1, 0.2}, 0.4, 0.5)); // T* = 0
     EXPECT_EQ(PUSH_OUTCOME::BilinearTooShort, code({0.05, 0.0, 1, 0}, 0.4, 0.5));
-    EXPECT_EQ(PUSH_OUTCOME::NoTarget, code(kYield, nan, 0.5));
-    const double inf = std::numeric_limits<double>::infinity();
-    EXPECT_FALSE(CalcTargetDisp(kYield, kG, 0.4, inf, false).found);
-    const T_TARGET_DISP zeroTc = CalcTargetDisp({0.0, 0.2, 1, 0.2}, kG, 0.4, 0.0, true);
-    EXPECT_TRUE(zeroTc.found); // T* = Tc = 0 is the long branch
-    EXPECT_EQ(0.0, zeroTc.dt);
+    EXPECT_EQ(PUSH_OUTCOME::NoTarget, code(kYield, std::nan(""), 0.5));
+    EXPECT_FALSE(CalcTargetDisp(kYield, kG, 0.4, HUGE_VAL, false).found);
+    EXPECT_TRUE(CalcTargetDisp({0.0, 0.2, 1, 0.2}, kG, 0.4, 0.0, true).found); // T* = Tc = 0: long
 }
 
 TEST(TargetDisp, NearestSteps)
@@ -145,28 +130,17 @@ TEST(TargetDisp, NearestSteps)
     EXPECT_EQ((std::vector<int>{2, kStepNone, 0}), FindNearestSteps(d, std::array{2.0, 9.0, 0.2}));
 }
 
-TEST(TargetDisp, PeakIsTheFirstOfTheLargest)
-{
-    EXPECT_EQ(1, FindPeakStep(std::array{1.0, 3.0, 3.0, 2.0}));
-    EXPECT_EQ(3, FindPeakStep(std::array{1.0, 3.0, 2.0, 4.0}));
-    EXPECT_EQ(0, FindPeakStep(std::array{3.0, 1.0}));
-}
-
 TEST(TargetDisp, DriftStep)
 {
     const std::vector<double> drifts{0.5, 0.25, 0.375, 0.75, 0.875, 0.5};
     const auto drift = [&](int step) { return std::optional(drifts[std::size_t(step)]); };
-    EXPECT_EQ(2, FindDriftStep(2, 5, 0.375, drift)); // at the peak within the limit
-    EXPECT_EQ(1, FindDriftStep(2, 5, 0.3, drift));
-    EXPECT_EQ(2,
-              FindDriftStep(4, 5, 0.5, drift)); // 0.375 is nearer than 0.75; step 0 does not count
+    EXPECT_EQ(2, FindDriftStep(2, 5, 0.375, drift));  // at the peak within the limit
+    EXPECT_EQ(2, FindDriftStep(4, 5, 0.5, drift));    // 0.375 is nearest; step 0 does not count
     EXPECT_EQ(1, FindDriftStep(4, 5, 0.3125, drift)); // a tie goes to the first
-    EXPECT_EQ(3, FindDriftStep(4, 5, 0.8, drift));
     const auto large = [](int) { return std::optional(2.5); };
     EXPECT_EQ(5, FindDriftStep(4, 5, 0.5, large)); // none nearer to the limit than 1: the last
     const auto unknown = [&](int step) { return step == 2 ? std::nullopt : drift(step); };
     EXPECT_EQ(std::nullopt, FindDriftStep(2, 5, 0.3, unknown));
-    EXPECT_EQ(std::nullopt, FindDriftStep(4, 5, 0.3, unknown));
 }
 
 TEST(TargetDisp, StrengthDrop)

@@ -7,8 +7,6 @@
 #include <QSvgRenderer>
 #include <gtest/gtest.h>
 
-#include <clocale>
-#include <cstdlib>
 #include <filesystem>
 #include <fstream>
 #include <iterator>
@@ -55,14 +53,6 @@ protected:
     std::string m_error = "old";
 };
 
-TEST_F(PlotFile, NumbersKeepTheCLocale)
-{
-    setenv("LC_ALL", "C.UTF-8", 1); // what Qt would set for numbers too
-    ASSERT_EQ(1, WritePlotFile(Plot(), Path("a.svg"), m_error)) << m_error;
-    EXPECT_STREQ("C", std::setlocale(LC_NUMERIC, nullptr));
-    EXPECT_EQ("", m_error);
-}
-
 TEST_F(PlotFile, PngHoldsTheCurve)
 {
     ASSERT_EQ(1, WritePlotFile(Plot(), Path("a.PNG"), m_error)) << m_error;
@@ -90,34 +80,6 @@ TEST_F(PlotFile, SvgLoadsAndHoldsTheTitle)
     EXPECT_EQ(1, Count());
 }
 
-TEST_F(PlotFile, PdfIsAWholeFileWithOneVectorPage)
-{
-    ASSERT_EQ(1, WritePlotFile(Plot(), Path("a.pdf"), m_error)) << m_error;
-    const std::string text = Content(Path("a.pdf"));
-    EXPECT_EQ(0u, text.find("%PDF-"));
-    EXPECT_NE(std::string::npos, text.rfind("%%EOF"));
-    EXPECT_NE(std::string::npos, text.find("/Count 1"));
-    EXPECT_NE(std::string::npos, text.find("/MediaBox [0 0 720")); // 960 x 640 px at 96 dpi
-    EXPECT_EQ(std::string::npos, text.find("/Subtype /Image"));
-    EXPECT_EQ(1, Count());
-}
-
-TEST_F(PlotFile, WorksAgainAndBesideAnApplication)
-{
-    ASSERT_EQ(1, WritePlotFile(Plot(), Path("a.svg"), m_error)) << m_error;
-    ASSERT_EQ(1, WritePlotFile(Plot(), Path("b.svg"), m_error)) << m_error;
-    NeedApp();
-    ASSERT_EQ(1, WritePlotFile(Plot(), Path("c.svg"), m_error)) << m_error;
-    EXPECT_EQ(Content(Path("a.svg")), Content(Path("b.svg")));
-    EXPECT_EQ(Content(Path("a.svg")), Content(Path("c.svg")));
-}
-
-TEST_F(PlotFile, AnEmptyPlotIsAFileThatSaysSo)
-{
-    ASSERT_EQ(1, WritePlotFile(T_PLOT(), Path("a.svg"), m_error)) << m_error;
-    EXPECT_NE(std::string::npos, Content(Path("a.svg")).find("no data"));
-}
-
 TEST_F(PlotFile, UnknownExtensionIsRefusedAndLeavesNothing)
 {
     for (const char* name : {"a.gif", "a", "svg", "a.svg.txt"}) {
@@ -136,14 +98,6 @@ TEST_F(PlotFile, AFileThatCanNotBeWrittenLeavesNothing)
     }
     EXPECT_EQ(1, Count());
     EXPECT_TRUE(fs::is_empty(m_dir / "folder.svg"));
-}
-
-TEST_F(PlotFile, ReplacesAnOldFile)
-{
-    std::ofstream(Path("a.svg")) << "old";
-    ASSERT_EQ(1, WritePlotFile(Plot(), Path("a.svg"), m_error)) << m_error;
-    EXPECT_EQ(0u, Content(Path("a.svg")).find("<?xml"));
-    EXPECT_EQ(1, Count());
 }
 
 } // namespace

@@ -42,22 +42,6 @@ TEST(PlotGeometry, DecimationKeepsASpikeAndStaysBounded)
                                [](const T_PLOT_PX& a, const T_PLOT_PX& b) { return a.x < b.x; }));
 }
 
-TEST(PlotGeometry, DecimationLeavesSparseRunsAlone)
-{
-    const PLOT_RUN run{{0.1, 1}, {0.4, 5}, {0.6, 0.5}, {0.9, 3}, {1.2, 4}, {7.0, 4}};
-    EXPECT_EQ(run, DecimateRun(run, 1.0));
-    EXPECT_TRUE(DecimateRun({}, 1.0).empty());
-}
-
-TEST(PlotGeometry, ColumnsLeftOfZeroAreNotMergedWithThoseToTheRight)
-{
-    PLOT_RUN run; // one column from -1 to 0 and one from 0 to 1
-    for (int i = 0; i < 10; ++i)
-        run.push_back({-0.95 + 0.2 * i, static_cast<double>(i)});
-    const PLOT_RUN expected{run[0], run[4], run[5], run[9]};
-    EXPECT_EQ(expected, DecimateRun(run, 1.0));
-}
-
 TEST(PlotGeometry, ClipCutsAtTheEdges)
 {
     const T_PLOT_BOX box{0, 0, 10, 10};

@@ -2,7 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include <cmath>
 #include <limits>
 #include <string>
 
@@ -59,33 +58,6 @@ TEST(PlotLayout, TwentyCloseLabelsStandApart)
     EXPECT_GT(leaders, 0);
 }
 
-TEST(PlotLayout, LabelsInCornersStayInside)
-{
-    T_PLOT plot = Curve();
-    plot.x.range = T_PLOT_RANGE{0, 4};
-    plot.y.range = T_PLOT_RANGE{0, 10};
-    for (const double x : {0.0, 4.0})
-        for (const double y : {0.0, 10.0})
-            plot.labels.push_back({x, y, "a label of some length\nwith two lines"});
-    const T_PLOT_LAYOUT layout = Calc(plot);
-    EXPECT_EQ(4u, layout.labels.size());
-    ExpectApart(layout);
-}
-
-TEST(PlotLayout, GuideLabelsStandApart)
-{
-    T_PLOT plot = Curve();
-    for (int i = 0; i < 6; ++i) {
-        plot.guides.push_back({PLOT_GUIDE::Vertical, 2.0 + 0.02 * i, "limit state", {}, {}});
-        plot.guides.push_back({PLOT_GUIDE::Horizontal, 5.0 + 0.02 * i, "design shear", {}, {}});
-        plot.guides.push_back({PLOT_GUIDE::Radial, 1.0 + i, "T = 1.25 s", {}, {}});
-    }
-    const T_PLOT_LAYOUT layout = Calc(plot);
-    EXPECT_EQ(18u, layout.guides.size());
-    EXPECT_EQ(18u, layout.labels.size());
-    ExpectApart(layout);
-}
-
 TEST(PlotLayout, RadialLinePassesThroughTheOriginWithItsSlope)
 {
     T_PLOT plot = Curve();
@@ -124,18 +96,6 @@ TEST(PlotLayout, PointsThatAreNotFiniteLeaveAGap)
     EXPECT_EQ(2u, layout.curves[0].lines[2].size());
 }
 
-TEST(PlotLayout, NothingToShowIsSaid)
-{
-    EXPECT_FALSE(Calc(T_PLOT()).hasData);
-    T_PLOT plot;
-    plot.series.push_back({"s", {kNan, 1.0}, {1.0, kNan}});
-    EXPECT_FALSE(Calc(plot).hasData);
-    plot.series[0] = {"s", {1, 2}, {-1, 0}};
-    plot.y.log = true;
-    EXPECT_FALSE(Calc(plot).hasData);
-    EXPECT_GT(Calc(plot).area.w, 0.0);
-}
-
 TEST(PlotLayout, CurvesNeverLeaveTheFrame)
 {
     T_PLOT plot = Curve();
@@ -165,28 +125,6 @@ TEST(PlotLayout, TextsStayOnThePageAndTickLabelsApart)
             EXPECT_FALSE(layout.texts[i].box.Meets(layout.texts[k].box))
                 << layout.texts[i].text << " on " << layout.texts[k].text;
     }
-}
-
-TEST(PlotLayout, TooSmallAPageHasNoFrame)
-{
-    EXPECT_EQ(0.0, Calc(Curve(), {}, {0, 0, 60, 60}).area.w);
-    EXPECT_EQ(0.0, Calc(Curve(), {}, {0, 0, 900, 60}).area.w);
-    EXPECT_EQ(0.0, Calc(Curve(), {}, {0, 0, 60, 900}).area.w);
-    EXPECT_EQ(0.0, Calc(Curve(), {}, {0, 0, 0, 0}).area.w);
-}
-
-TEST(PlotLayout, SeriesDifferWithoutColour)
-{
-    T_PLOT plot;
-    for (int i = 0; i < 8; ++i)
-        plot.series.push_back({"s", {0, 1}, {0, 1.0 + i}});
-    const T_PLOT_LAYOUT layout = Calc(plot);
-    for (std::size_t i = 0; i < 8; ++i)
-        for (std::size_t k = 0; k < i; ++k) {
-            const T_PLOT_STYLE& a = layout.curves[i].style;
-            const T_PLOT_STYLE& b = layout.curves[k].style;
-            EXPECT_TRUE(a.line != b.line || a.marker != b.marker) << i << " and " << k;
-        }
 }
 
 } // namespace

@@ -1,5 +1,4 @@
 #include "hingesample.h"
-#include "qm_rps/po_hingefemaenrgdsptgrid.h"
 #include "qm_rps/po_hingeskcvtabfemaaxialgrid.h"
 #include "qm_rps/po_hingeskcvtabfemadlg.h"
 
@@ -28,21 +27,20 @@ struct T_CASE {
 // Each rule just outside and just inside its bound.
 // clang-format off
 const T_CASE kCases[] = {
-    { "",           [](F&) {} },
     { "F(B) > 0",   [](F& f) { f.sides.pos.B.strength = 0; } },
     { "",           [](F& f) { f.sides.pos.B.strength = 1e-12; } },
     { "D(B) > 0",   [](F& f) { f.sides.pos.B.deform = 0; } },
     { "",           [](F& f) { f.sides.pos.B.deform = 0; f.measure = SKEL_MEASURE::Plastic; } },
     { "F(C) > 0",   [](F& f) { f.sides.pos.C.strength = 0; } },
     { "F(D) >= 0",  [](F& f) { f.sides.pos.D.strength = -1e-12; } },
-    { "F(E) >= 0",  [](F& f) { f.sides.pos.E.strength = -1e-12; } },
-    { "",           [](F& f) { f.sides.pos.D.strength = f.sides.pos.E.strength = 0; } },
+    { "",           [](F& f) { // many at their bounds at once
+        f.sides.pos.D.strength = f.sides.pos.E.strength = f.sides.neg.D.strength = f.sides.neg.E.strength = 0;
+        f.sides.pos.IO = 4, f.sides.neg.IO = -3, f.dcRatio = T_SIDES<double>{0, 1}, f.unloadProportion = 1; } },
     { "F(-B) < 0",  [](F& f) { f.sides.neg.B.strength = 0; } },
     { "D(-B) < 0",  [](F& f) { f.sides.neg.B.deform = 0; } },
     { "F(-C) < 0",  [](F& f) { f.sides.neg.C.strength = 0; } },
     { "F(-D) <= 0", [](F& f) { f.sides.neg.D.strength = 1e-12; } },
     { "F(-E) <= 0", [](F& f) { f.sides.neg.E.strength = 1e-12; } },
-    { "",           [](F& f) { f.sides.neg.D.strength = f.sides.neg.E.strength = 0; } },
     { "D(B) <  D(C)",  [](F& f) { f.sides.pos.C.deform = 1; } },
     { "",              [](F& f) { f.sides.pos.C.deform = 1; f.sides.pos.C.strength = 1; } },
     { "D(B) <= D(C)",  [](F& f) { f.sides.pos.C.deform = 0.999; f.sides.pos.C.strength = 1; } },
@@ -66,11 +64,9 @@ const T_CASE kCases[] = {
     { "F(-D) <= F(-E)", [](F& f) { f.sides.neg.E.strength = -0.301; } },
     { "F(-E) = F(-D)",  [](F& f) { f.strengthLoss = false; f.sides.neg.E.strength = -0.299; } },
     { "IO <= LS",  [](F& f) { f.sides.pos.IO = 4.001; } },
-    { "",          [](F& f) { f.sides.pos.IO = 4; f.sides.neg.IO = -3; } },
     { "IO <= LS",  [](F& f) { f.sides.neg.IO = -3.001; } },
     { "LS <= CP",  [](F& f) { f.sides.pos.LS = 6.001; } },
     { "LS <= CP",  [](F& f) { f.sides.neg.CP = -2.999; } },
-    { "",          [](F& f) { f.dcRatio = T_SIDES<double>{0, 1}; } },
     { "IDS_RPS_Error_Pushove_Hinge_Properties_DC_RATIO", [](F& f) { f.dcRatio = T_SIDES<double>{-0.001, 1}; } },
     { "IDS_RPS_Error_Pushove_Hinge_Properties_DC_RATIO", [](F& f) { f.dcRatio = T_SIDES<double>{0, 1.001}; } },
     { "IDS_RPS_PO_FEMA_Yield_FY_P", [](F& f) { f.sides.pos.yield = 0; } },
@@ -83,28 +79,20 @@ const T_CASE kCases[] = {
     { "IDS_RPS_PO_PHGT_UNLOADING_EXP", [](F& f) { f.unloadExponent = -0.001; } },
     { "IDS_RPS_PO_PHGT_UNLOADING_PRF", [](F& f) { f.unloadProportion = -0.001; } },
     { "IDS_RPS_PO_PHGT_UNLOADING_PRF", [](F& f) { f.unloadProportion = 1.001; } },
-    { "",                              [](F& f) { f.unloadProportion = 1; } },
-    { "",           [](F& f) { f.sides.pos.energy[0] = -1; f.unloadFactor = 2; } }, // model off
     { "",           [](F& f) { f.energyBased = true; f.unloadFactor = -1; } },
     { "",           [](F& f) { f.energyBased = true; f.unloadFactor = 1; f.sides.pos.energy = {}; } },
     { "A~B >= 0.0", [](F& f) { f.energyBased = true; f.sides.pos.energy[0] = -0.001; } },
     { "A~B >= 0.0", [](F& f) { f.energyBased = true; f.sides.neg.energy[0] = -0.001; f.sides.pos.energy[1] = 2; } },
-    { "A~B >= C",   [](F& f) { f.energyBased = true; f.sides.pos.energy[1] = 1.001; f.sides.neg.energy[3] = -1; } },
     { "C >= D",     [](F& f) { f.energyBased = true; f.sides.pos.energy[2] = 0.751; } },
     { "D >= E",     [](F& f) { f.energyBased = true; f.sides.pos.energy[3] = 0.501; } },
     { "E >= 0.0",   [](F& f) { f.energyBased = true; f.sides.pos.energy[3] = -0.001; } },
     { "A~B >= C",   [](F& f) { f.energyBased = true; f.sides.neg.energy[1] = 1.001; } },
-    { "C >= D",     [](F& f) { f.energyBased = true; f.sides.neg.energy[2] = 0.751; } },
-    { "D >= E",     [](F& f) { f.energyBased = true; f.sides.neg.energy[3] = 0.501; } },
-    { "E >= 0.0",   [](F& f) { f.energyBased = true; f.sides.neg.energy[3] = -0.001; } },
     { "-1.0 <= Unloading Stiffness Factor <= 1.0", [](F& f) { f.energyBased = true; f.unloadFactor = 1.001; } },
     { "-1.0 <= Unloading Stiffness Factor <= 1.0", [](F& f) { f.energyBased = true; f.unloadFactor = -1.001; } },
     { "F(B) > 0",   [](F& f) { f.sides.pos.B.strength = kNan; } },
     { "D(C) <= D(D) <= D(E)", [](F& f) { f.sides.pos.E.deform = kNan; f.sides.pos.E.strength = 0.1; } },
-    { "IDS_RPS_PO_PHGT_UNLOADING_EXP", [](F& f) { f.unloadExponent = kNan; } },
     { "",           [](F& f) { f.symmetric = true; f.sides.neg = {}; } }, // mirrored, not entered
     { "IDS_RPS_MULTI_CURVE_COUNT", [](F& f) { f.multiCurve = true; f.curves = {{0, f.sides}}; f.curves[0].sides.pos.B.strength = 0; } },
-    { "",           [](F& f) { f.multiCurve = true; f.curves = {{0, f.sides}, {5, f.sides}}; f.sides.pos.B.strength = 0; } },
     { "F(B) > 0",   [](F& f) { f.multiCurve = true; f.curves = {{0, f.sides}, {5, f.sides}}; f.curves[1].sides.pos.B.strength = 0; } },
     { "Axial Force 5 already exists!", [](F& f) { f.multiCurve = true; f.curves = {{5, f.sides}, {5, f.sides}}; } },
 };
@@ -142,22 +130,6 @@ TEST(HingeFemaCurve, ChecksTheGroupsInTheirOrder)
     }
 }
 
-TEST(HingeFemaCurve, OrdersDeformationsBeforeStrengthsAndPositiveBeforeNegative)
-{
-    F f = ValidBackbone<F>();
-    f.sides.neg.D.deform = -4;    // third
-    f.sides.pos.E.strength = 0.3; // second
-    f.sides.pos.D.deform = 5;     // first
-    const auto found = FindingsOf(f);
-    ASSERT_EQ(3u, found.size());
-    EXPECT_EQ("D(C) <= D(D) <= D(E)", found[0].ruleText);
-    EXPECT_EQ("F(E) <= F(D)", found[1].ruleText);
-    EXPECT_EQ("F(D) must be equal to or larger than F(E)", found[1].wording);
-    EXPECT_EQ("D(-E) <=  D(-D) <= D(-C)", found[2].ruleText);
-    EXPECT_EQ(HINGE_SIDE::Negative, found[2].side);
-    EXPECT_EQ("sides.neg.D.deform", found[2].field);
-}
-
 TEST(HingeFemaCurve, ShowsTheFirstFindingAndWritesNothing)
 {
     T_HINGE_COMPONENT data = ComponentWith(SKEL_TYPE::Fema, ValidBackbone<F>());
@@ -172,14 +144,10 @@ TEST(HingeFemaCurve, ShowsTheFirstFindingAndWritesNothing)
     const auto found = dlg.Findings();
     ASSERT_EQ(2u, found.size());
     EXPECT_EQ(HINGE_END::J, found[0].end);
-    EXPECT_EQ(static_cast<int>(kMy), found[0].component);
-    ASSERT_EQ(1u, dlg.Messages().size());
-    EXPECT_EQ(found[0].text, dlg.Messages()[0].text);
     EXPECT_EQ("Hinge properties of component My are wrong. This rule is not kept: M(B) > 0.",
-              found[0].text);
+              dlg.Messages().at(0).text);
     dlg.Component(kMy)->active = false;
     EXPECT_TRUE(dlg.Findings().empty());
-    EXPECT_EQ(0, dlg.Data2Dlg(kFx, ComponentWith(SKEL_TYPE::Ec8, T_SKEL_EC8())));
 }
 
 TEST(HingeFemaCurve, WritesSymmetricCurvesMirrored)
@@ -196,38 +164,6 @@ TEST(HingeFemaCurve, WritesSymmetricCurvesMirrored)
     EXPECT_EQ(100, n.yield);
 }
 
-TEST(HingeFemaCurve, NamesItsPages)
-{
-    CPO_HingeSkcvTabFemaDlg dlg;
-    T_HINGE_COMPONENT data = ComponentWith(SKEL_TYPE::Fema, F());
-    const auto titles = [&](bool same, HINGE_LOCATION at) {
-        data.sameEnds = same;
-        data.location = at;
-        EXPECT_EQ(1, dlg.Data2Dlg(kFx, data));
-        std::string text;
-        for (const char* t : dlg.PageTitles(kFx))
-            text += std::string(t).substr(15) + " ";
-        return text;
-    };
-    EXPECT_EQ("PropertiesIJ ", titles(true, HINGE_LOCATION::BothEnds));
-    EXPECT_FALSE(dlg.IsNeedIJTab(kFx));
-    EXPECT_EQ("PropertiesI PropertiesJ ", titles(false, HINGE_LOCATION::BothEnds));
-    EXPECT_TRUE(dlg.IsNeedIJTab(kFx));
-    EXPECT_EQ("Properties ", titles(false, HINGE_LOCATION::Center));
-}
-
-TEST(HingeFemaCurve, TakesAutomaticYieldStrengthsOnlyWhileTheyAreAutomatic)
-{
-    CPO_HingeSkcvTabFemaDlg dlg;
-    ASSERT_EQ(1, dlg.Data2Dlg(kFx, ComponentWith(SKEL_TYPE::Fema, ValidBackbone<F>())));
-    dlg.SetAutoCalcValue(kFx, HINGE_END::I, {7, 8});
-    EXPECT_EQ(100, dlg.Curve(kFx, HINGE_END::I)->sides.pos.yield);
-    dlg.Curve(kFx, HINGE_END::I)->autoYield = true;
-    dlg.SetAutoCalcValue(kFx, HINGE_END::I, {7, 8});
-    EXPECT_EQ(7, dlg.Curve(kFx, HINGE_END::I)->sides.pos.yield);
-    EXPECT_EQ(8, dlg.Curve(kFx, HINGE_END::I)->sides.neg.yield);
-}
-
 TEST(HingeAxialForces, RefusesTheSameTheMissingAndTheOutlying)
 {
     F f = ValidBackbone<F>();
@@ -237,7 +173,6 @@ TEST(HingeAxialForces, RefusesTheSameTheMissingAndTheOutlying)
     EXPECT_EQ(0, grid.AddForce(200));
     EXPECT_EQ("Axial Force 200 already exists!", grid.Messages().back().text);
     EXPECT_EQ(0, grid.RemoveForce(1.5));
-    EXPECT_EQ("Axial Force 1.5 does not exist!", grid.Messages().back().text);
     EXPECT_EQ(0, grid.ChangeForce(3, 4));
     EXPECT_EQ("Old Axial Force 3 does not exist!", grid.Messages().back().text);
     EXPECT_EQ(0, grid.ChangeForce(-100, 200));
@@ -256,16 +191,6 @@ TEST(HingeAxialForces, RefusesTheSameTheMissingAndTheOutlying)
     EXPECT_EQ(-500, curves[0].axial);
     EXPECT_EQ(200, curves[1].axial);
     EXPECT_EQ((T_SKEL_AXIAL{300, f.sides}), curves[2]);
-}
-
-TEST(HingeEnergyGrid, ShowsTheRuleThatARowBreaks)
-{
-    CPO_HingeFEMAEnrgDsptGrid grid;
-    grid.Data2Dlg(ValidBackbone<F>().sides);
-    EXPECT_EQ(1, grid.CheckData());
-    grid.m_factors[1][2] = 0.8;
-    EXPECT_EQ(0, grid.CheckData());
-    EXPECT_NE(std::string::npos, grid.Messages().back().text.find("C >= D"));
 }
 
 } // namespace

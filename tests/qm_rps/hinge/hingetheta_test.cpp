@@ -1,7 +1,6 @@
 #include "qm_rps/hingetheta.h"
 
 #include <gtest/gtest.h>
-#include <limits>
 
 namespace {
 
@@ -48,7 +47,6 @@ TEST(HingeTheta, FollowsComponentEndAndOption)
     const T_CASE cases[] = {
         {"My I 6EI/L", true, C::My, L::IEnd, S::EI6L, 3.9e8, 3.9e8 / 1.95e10},
         {"My I 3EI/L", true, C::My, L::IEnd, S::EI3L, 3.9e8, 0.04},
-        {"My I 2EI/L", true, C::My, L::IEnd, S::EI2L, 3.9e8, 0.06},
         {"My J 6EI/L", true, C::My, L::JEnd, S::EI6L, 3.9e8, 0.04},
         {"Mz I 6EI/L", true, C::Mz, L::IEnd, S::EI6L, 1.56e8, 0.01},
         {"Mz J 6EI/L", true, C::Mz, L::JEnd, S::EI6L, 1.56e8, 0.0125},
@@ -56,18 +54,14 @@ TEST(HingeTheta, FollowsComponentEndAndOption)
         {"negative", true, C::My, L::IEnd, S::EI6L, -3.9e8, -0.02},
         {"Fy I", false, C::Fy, L::IEnd, S::Elastic, 1e5, 1e-3}, // K = 1e5 * 1000
         {"Fy J", false, C::Fy, L::JEnd, S::Elastic, 1e5, 2e-3}, // 1e5 * 500
-        {"Fz I", false, C::Fz, L::IEnd, S::Elastic, 2e5, 2e-3}, // 1e5 * 1000
         {"Fz J", false, C::Fz, L::JEnd, S::Elastic, 2e5, 1e-3}, // 1e5 * 2000
         {"Fz user", false, C::Fz, L::JEnd, S::User, 2e5, 2e-6}, // 1e11
         {"moment of Fy", true, C::Fy, L::IEnd, S::EI6L, 1e8, 0},
-        {"moment of Mx", true, C::Mx, L::IEnd, S::User, 1e8, 0},
-        {"moment elastic", true, C::My, L::IEnd, S::Elastic, 1e8, 0},
         {"moment at centre", true, C::My, L::Center, S::EI6L, 1e8, 0},
         {"moment at both", true, C::My, L::BothEnds, S::EI6L, 1e8, 0},
         {"shear of My", false, C::My, L::IEnd, S::Elastic, 1e5, 0},
         {"shear of Fx", false, C::Fx, L::IEnd, S::User, 1e5, 0},
         {"shear 6EI/L", false, C::Fy, L::IEnd, S::EI6L, 1e5, 0},
-        {"shear 2EI/L", false, C::Fy, L::IEnd, S::EI2L, 1e5, 0},
     };
     for (const T_CASE& c : cases) {
         const double r = c.moment ? CHingeTheta::CalcThetaMoment(lookup, c.component, c.end,
@@ -92,7 +86,6 @@ TEST(HingeTheta, IsZeroWithoutBasisOrStiffness)
     EXPECT_EQ(0.0, moment(&section, &material, 1, -5)) << "negative stiffness";
     EXPECT_EQ(0.0, moment(&section, &material, 1, 0.9e-10));
     EXPECT_DOUBLE_EQ(1 / 1.1e-10, moment(&section, &material, 1, 1.1e-10));
-    EXPECT_EQ(0.0, moment(&section, &material, std::numeric_limits<double>::quiet_NaN(), 0));
 }
 
 TEST(HingeTheta, TakesTheInertiaOfAShapeFromItsDimensions)
@@ -103,10 +96,9 @@ TEST(HingeTheta, TakesTheInertiaOfAShapeFromItsDimensions)
     s.Iyy = 1.0; // entered values of a shape do not count
     const T_MATL_D material = Material();
     // 6 * 260000 * 3.125e9 / 4875 = 1e12
-    EXPECT_NEAR(
-        1e-3, CHingeTheta::CalcThetaMoment({&s, &material, 4875}, C::My, L::IEnd, S::EI6L, 0, 1e9),
-        1e-12);
+    const T_THETA_LOOKUP lookup{&s, &material, 4875};
+    const double theta = CHingeTheta::CalcThetaMoment(lookup, C::My, L::IEnd, S::EI6L, 0, 1e9);
+    EXPECT_NEAR(1e-3, theta, 1e-12);
     s.size = {500, -300};
-    EXPECT_EQ(0.0,
-              CHingeTheta::CalcThetaMoment({&s, &material, 4875}, C::My, L::IEnd, S::EI6L, 0, 1e9));
+    EXPECT_EQ(0.0, CHingeTheta::CalcThetaMoment(lookup, C::My, L::IEnd, S::EI6L, 0, 1e9));
 }

@@ -34,7 +34,6 @@ TEST(PmmInteractionDlg, NoValueRisesAndPmaxIsNotNegative)
     const T_CASE cases[] = {
         {"falling", [](T_PMM_TABLE&) {}, nullptr, ""},
         {"equal P", [](T_PMM_TABLE& t) { t.curves[0][5].p = t.curves[0][4].p; }, nullptr, ""},
-        {"equal M", [](T_PMM_TABLE& t) { t.curves[1][10].m = t.curves[1][9].m; }, nullptr, ""},
         {"P rises", [](T_PMM_TABLE& t) { t.curves[0][5].p = t.curves[0][4].p + 1e-9; }, kCurve,
          "curves[0][5].p"},
         {"M rises", [](T_PMM_TABLE& t) { t.curves[1][10].m = t.curves[1][9].m + 1e-9; }, kCurve,
@@ -42,7 +41,6 @@ TEST(PmmInteractionDlg, NoValueRisesAndPmaxIsNotNegative)
         {"first P NaN", [](T_PMM_TABLE& t) { t.curves[1][0].p = kNan; }, kCurve, "curves[1][0].p"},
         {"Pmax 0", [](T_PMM_TABLE& t) { t.Pmax = 0; }, nullptr, ""},
         {"Pmax negative", [](T_PMM_TABLE& t) { t.Pmax = -1e-9; }, kPmax, "Pmax"},
-        {"Pmax NaN", [](T_PMM_TABLE& t) { t.Pmax = kNan; }, kPmax, "Pmax"},
         {"curve first", [](T_PMM_TABLE& t) { t.Pmax = -1, t.curves[1][3].m = 2; }, kCurve,
          "curves[1][3].m"},
     };
@@ -57,7 +55,6 @@ TEST(PmmInteractionDlg, NoValueRisesAndPmaxIsNotNegative)
         if (!c.key) continue;
         ASSERT_EQ(1u, dlg.Messages().size());
         EXPECT_EQ(c.key, dlg.Messages()[0].key);
-        EXPECT_EQ(c.key, dlg.Findings().front().messageKey);
         EXPECT_EQ(c.field, dlg.Findings().front().field);
     }
     T_PMM_TABLE record = Table();
@@ -65,23 +62,6 @@ TEST(PmmInteractionDlg, NoValueRisesAndPmaxIsNotNegative)
     record.curves[1][1].m = 2;
     record.Pmax = -1;
     EXPECT_EQ(3u, CPushOverPMMInteractionDlg(record).Findings().size());
-}
-
-TEST(PmmInteractionGrid, ShowsFiveDigitsAndOneCurvePerAxis)
-{
-    T_PMM_TABLE t = Table();
-    CPushoverPMMInteractionGrid grid(t);
-    ASSERT_EQ(1, grid.SelectCurve(3)); // Pz-Mz(-)
-    EXPECT_EQ(1, grid.SetCellText(2, 0, "0.123456789"));
-    EXPECT_EQ(0.123456789, t.curves[1][2].p);
-    EXPECT_EQ("0.12346", grid.CellText(2, 0));
-    ASSERT_EQ(1, grid.SelectCurve(2));
-    EXPECT_EQ("0.12346", grid.CellText(2, 0));
-    ASSERT_EQ(1, grid.SelectCurve(1));
-    EXPECT_EQ("0.8", grid.CellText(2, 0));
-    EXPECT_EQ(0, grid.SelectCurve(4));
-    EXPECT_EQ(1u, grid.Curve());
-    EXPECT_EQ("", grid.CellText(11, 0));
 }
 
 TEST(PmmInteractionGrid, PastesABlockThatFitsAndNothingElse)
@@ -98,35 +78,26 @@ TEST(PmmInteractionGrid, PastesABlockThatFitsAndNothingElse)
     };
     const T_CASE cases[] = {
         {"block", "3\t4\r\n5\t 6 \r\n", {1, 0}, nullptr},
-        {"last row and column", "7", {10, 1}, nullptr},
         {"selection of its size", "1\t2\n3\t4", {9, 0, 2, 2}, nullptr},
         {"too wide", "1\t2", {0, 1}, kColumn},
-        {"three columns", "1\t2\t3", {0, 0}, kColumn},
         {"too high", "1\n2", {10, 0}, kRow},
-        {"wide and high", "1\t2\n1\t2", {10, 1}, kColumn},
-        {"smaller selection", "1\t2\n3\t4", {0, 0, 1, 2}, kRange},
         {"larger selection", "1\t2", {0, 0, 2, 2}, kRange},
         {"selection beyond the grid", "1\n2", {10, 0, 2, 1}, kRow},
         {"ragged", "1\t2\n3", {0, 0}, kRange},
         {"empty", "", {0, 0}, kRange},
-        {"outside", "1", {11, 0}, kRange},
         {"text", "1\tx", {0, 0}, kNumber},
         {"decimal comma", "1\t2,5", {0, 0}, kNumber},
         {"not finite", "1\tinf", {0, 0}, kNumber},
-        {"empty cell", "1\t", {0, 0}, kNumber},
     };
     for (const T_CASE& c : cases) {
         SCOPED_TRACE(c.label);
         T_PMM_TABLE t = Table();
         CPushoverPMMInteractionGrid grid(t);
         EXPECT_EQ(c.key ? 0 : 1, grid.Paste(c.text, c.range));
-        if (c.key) {
-            EXPECT_EQ(Table(), t);
-            ASSERT_EQ(1u, grid.Messages().size());
-            EXPECT_EQ(c.key, grid.Messages()[0].key);
-        } else {
-            EXPECT_TRUE(grid.Messages().empty());
-        }
+        EXPECT_EQ(c.key ? 1u : 0u, grid.Messages().size());
+        if (!c.key) continue;
+        EXPECT_EQ(Table(), t);
+        EXPECT_EQ(c.key, grid.Messages().at(0).key);
     }
     T_PMM_TABLE t = Table();
     CPushoverPMMInteractionGrid grid(t);
