@@ -9,6 +9,8 @@
 #include "qm_rps/pushovercalcperfptfema440procc.h"
 #include "qm_rps/pushovercalcperfptproca.h"
 #include "qm_rps/pushovercalcperfptprocb.h"
+#include "qm_rps/pushovercurvesub1dlg.h"
+#include "qm_rps/pushovercurvesub4dlg.h"
 
 #include <algorithm>
 #include <cmath>
@@ -27,11 +29,6 @@ const char* GammaKey(const T_EVAL_D& eval, const T_PUSH_FACTORS& factors)
 {
     if (eval.method >= PUSH_METHOD::Ntc2008) return "IDS_RPS_PO_CURVE_GAMMA_NTC";
     return factors.eigenBased ? "IDS_RPS_PO_CURVE_GAMMA_FEMA" : "IDS_RPS_PO_CURVE_GAMMA_2D_FEMA";
-}
-
-bool InUnitRange(const std::optional<double>& v)
-{
-    return !v || (*v > 0.0 && *v <= 1.0);
 }
 
 } // namespace
@@ -66,12 +63,7 @@ int CPushOverCurveDlg::SetEvaluation(const T_EVAL_D& evaluation)
         m_settingsError = "no spectrum \"" + evaluation.spectrum + "\"";
         return 0;
     }
-    const auto& bilinear = evaluation.bilinear;
-    if (bilinear && (!InUnitRange(bilinear->secant) || !InUnitRange(bilinear->drop))) {
-        m_settingsError = zql::lib::MMSGFunction::GetValue("IDS_DB_PO_CURVE_PP_BETWEEN_0_1");
-        ShowMessage("IDS_DB_PO_CURVE_PP_BETWEEN_0_1");
-        return 0;
-    }
+    if (!CheckPages(evaluation)) return 0;
     m_settingsError.clear();
     m_eval = evaluation;
     m_eval.masonry = evaluation.masonry.value_or(false) || ExistEC8OrMasonry();
@@ -88,6 +80,24 @@ int CPushOverCurveDlg::SetEvaluation(const T_EVAL_D& evaluation)
     }
     SetDamping(damping);
     SetAlphaInPercent(evaluation.alphaInPercent.value_or(false));
+    return 1;
+}
+
+// The rules of the window's pages; their first message is the reason.
+int CPushOverCurveDlg::CheckPages(const T_EVAL_D& evaluation)
+{
+    CPushOverCurveSub1Dlg method;
+    method.m_method = evaluation.method;
+    method.m_procedure = evaluation.procedure.value_or('A');
+    CPushOverCurveSub4Dlg bilinear;
+    bilinear.Data2Dlg(evaluation.bilinear);
+    for (zql::frx::MDialog* page :
+         {static_cast<zql::frx::MDialog*>(&method), static_cast<zql::frx::MDialog*>(&bilinear)}) {
+        if (page->CheckData()) continue;
+        m_settingsError = page->Messages().back().text;
+        ShowMessage(page->Messages().back().key, m_settingsError);
+        return 0;
+    }
     return 1;
 }
 

@@ -68,6 +68,7 @@ public:
     int ExistEC8() const;
 
 private:
+    int CheckPages(const T_EVAL_D& evaluation);
     int UpdatePerformancePoint();
     int UpdateTargetDispData();
     T_TARGET_INPUT TargetInput();
