@@ -52,7 +52,7 @@ void ExpectConverted(const T_PHGT_D& t, const T_UNITS& a, const T_UNITS& b, bool
     const bool rotation = t.definition == HINGE_DEFINITION::MomentRotation;
     const auto f = [&](int force, int length) { return 2.5 * Factor(a, b, force, length); };
     for (std::size_t i = 0; i < 6; ++i) {
-        const T_EXPECTED& e = (rotation ? kRotation : kCurvature)[i / 3];
+        const T_EXPECTED& e = rotation ? kRotation[i / 3] : kCurvature[i / 3];
         const auto& curve = std::get<T_SKEL_FEMA>(t.components[i].curves.J);
         const int measure = plastic ? e.deform[1] : 0;
         for (const T_SKEL_SIDE& side : {curve.sides.neg, curve.curves[0].sides.pos}) {
