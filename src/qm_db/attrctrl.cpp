@@ -91,7 +91,12 @@ int CAttrCtrl::GetElem(int id, T_ELEM_D& out) const
 
 int CAttrCtrl::GetPhgt(int key, T_PHGT_D& out) const
 {
-    return Get(m_data.Model().hingeTypes, key, m_data.Units(), out);
+    const auto it = m_data.Model().hingeTypes.find(key);
+    if (it == m_data.Model().hingeTypes.end()) return 0;
+    out = it->second;
+    // As entered, so that a switch of the deformation measure starts from the entered digits.
+    ForEachQuantity(out, [&](double& v, T_DIM d) { v = ShortFromSi(v, m_data.Units(), d); });
+    return 1;
 }
 
 int CAttrCtrl::GetPhge(int key, T_PHGE_D& out) const

@@ -1,5 +1,6 @@
 #include "qm_db/units.h"
 
+#include <charconv>
 #include <cstddef>
 
 namespace {
@@ -71,4 +72,15 @@ double MetresPer(LENGTH_UNIT unit)
 double SiFactor(const T_UNITS& units, T_DIM dim)
 {
     return Power(NewtonsPer(units.force), dim.force) * Power(MetresPer(units.length), dim.length);
+}
+
+double ShortFromSi(double value, const T_UNITS& units, T_DIM dim)
+{
+    const double plain = FromSi(value, units, dim);
+    std::array<char, 32> text{};
+    const auto end = std::to_chars(text.data(), text.data() + text.size(), plain,
+                                   std::chars_format::general, 15);
+    double rounded = plain;
+    std::from_chars(text.data(), end.ptr, rounded);
+    return ToSi(rounded, units, dim) == value ? rounded : plain;
 }

@@ -52,3 +52,7 @@ inline double FromSi(double value, const T_UNITS& units, T_DIM dim)
 {
     return value / SiFactor(units, dim);
 }
+
+/// The same, but of the values that convert back to exactly this SI value one with at most 15
+/// digits where there is one: entered digits come back as entered.
+double ShortFromSi(double value, const T_UNITS& units, T_DIM dim);

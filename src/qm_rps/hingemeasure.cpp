@@ -2,6 +2,8 @@
 
 #include <charconv>
 #include <cmath>
+#include <limits>
+#include <optional>
 
 namespace {
 
@@ -12,19 +14,36 @@ constexpr int kMaxDigits = 17;
 using T_CONVERT = double (*)(double, double);
 
 /// The shortest decimal near `value` that `back` turns into `target` exactly; else `value`.
-double ShortestPreimage(double value, double target, double thetaY, T_CONVERT back)
+/// Shortest decimal near `value`, of at most `digits` digits, that converts back to the target
+/// within `off`; nothing where there is none.
+std::optional<double> ShortDecimal(double value, double target, double thetaY, T_CONVERT back,
+                                   int maxDigits, double off)
 {
-    if (!std::isfinite(value) || std::fabs(thetaY) < kZeroTheta) return value;
     char text[40];
-    for (int digits = 1; digits <= kMaxDigits; ++digits) {
+    for (int digits = 1; digits <= maxDigits; ++digits) {
         const auto end =
             std::to_chars(text, text + sizeof text, value, std::chars_format::general, digits);
         double candidate = 0.0;
         std::from_chars(text, end.ptr, candidate);
         if (std::fabs(candidate - value) > kSnap * std::fabs(value)) continue;
-        if (back(candidate, thetaY) == target) return candidate;
+        if (std::fabs(back(candidate, thetaY) - target) <= off) return candidate;
     }
-    return value;
+    return std::nullopt;
+}
+
+double ShortestPreimage(double value, double target, double thetaY, SKEL_MEASURE to)
+{
+    if (!std::isfinite(value) || std::fabs(thetaY) < kZeroTheta) return value;
+    const T_CONVERT back = to == SKEL_MEASURE::Plastic ? RatioFromPlastic : PlasticFromRatio;
+    constexpr int kEntered = 15; // digits that a person enters at most
+    if (to == SKEL_MEASURE::DDy) {
+        // A plastic deformation that went through the units of a file may be off in its last bits.
+        const double lastBits = 4.0 * std::numeric_limits<double>::epsilon() * std::fabs(target);
+        for (const double off : {0.0, lastBits}) {
+            if (const auto v = ShortDecimal(value, target, thetaY, back, kEntered, off)) return *v;
+        }
+    }
+    return ShortDecimal(value, target, thetaY, back, kMaxDigits, 0.0).value_or(value);
 }
 
 template <class SIDE>
@@ -37,11 +56,10 @@ void ConvertSide(T_SKEL_SIDE& side, double sign, SKEL_MEASURE to)
 {
     const bool plastic = to == SKEL_MEASURE::Plastic;
     const T_CONVERT f = plastic ? PlasticFromRatio : RatioFromPlastic;
-    const T_CONVERT back = plastic ? RatioFromPlastic : PlasticFromRatio;
     const double theta = std::fabs(side.yieldDeform);
     for (double* v : ValuesOf(side)) {
         const double entered = sign * *v;
-        const double converted = ShortestPreimage(f(entered, theta), entered, theta, back);
+        const double converted = ShortestPreimage(f(entered, theta), entered, theta, to);
         *v = converted == 0.0 ? 0.0 : sign * converted; // no -0
     }
 }

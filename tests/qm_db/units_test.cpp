@@ -65,3 +65,17 @@ TEST(Units, EveryPairGoesToSiAndBack)
         }
     }
 }
+
+// Values that a person enters have few digits: they come back as entered in every pair of units.
+TEST(Units, EnteredDigitsComeBack)
+{
+    for (const double entered : {0.137, 1.2467, 10.0, 1e-7, 123456.789}) {
+        for (const LENGTH_UNIT length : {LENGTH_UNIT::mm, LENGTH_UNIT::in, LENGTH_UNIT::ft}) {
+            for (const FORCE_UNIT force : {FORCE_UNIT::kips, FORCE_UNIT::kgf, FORCE_UNIT::lbf}) {
+                const T_UNITS units{force, length};
+                for (const T_DIM dim : {kDimLength, kDimForce, kDimMoment, kDimStress})
+                    EXPECT_EQ(entered, ShortFromSi(ToSi(entered, units, dim), units, dim));
+            }
+        }
+    }
+}
