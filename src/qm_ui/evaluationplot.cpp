@@ -175,7 +175,8 @@ void AddNotes(T_PLOT& plot, const T_PUSH_EVALUATION& e)
             plot.notes.push_back(FormatText("%s demand = %.4g %s", row.name.c_str(), *row.demand,
                                             LengthUnit(e).c_str()));
     }
-    plot.notes.push_back(FormatText("Gamma = %.4g, m* = %.5g", e.factors.gamma, e.mStar));
+    plot.notes.push_back(FormatText("Gamma = %.4g, m* = %.5g %s s2/%s", e.factors.gamma, e.mStar,
+                                    ForceUnit(e).c_str(), LengthUnit(e).c_str()));
 }
 
 } // namespace
