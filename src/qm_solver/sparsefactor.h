@@ -1,0 +1,53 @@
+// Factorisation of a sparse symmetric matrix: the one class that hands matrices to the sparse
+// direct solver (MUMPS with a METIS ordering).
+#pragma once
+
+#include <cstddef>
+#include <memory>
+#include <span>
+#include <string>
+#include <vector>
+
+namespace solver {
+
+/// Upper triangle with the diagonal, by rows; columns ascending in a row, indices from 0.
+struct T_SYMMETRIC_MATRIX {
+    std::vector<int> rowStart; // size n + 1
+    std::vector<int> column;
+    std::vector<double> value;
+    std::size_t Size() const { return rowStart.empty() ? 0 : rowStart.size() - 1; }
+};
+
+/// Figures of the last factorisation.
+struct T_FACTOR_INFO {
+    double factorBytes = 0.0;            // memory of the factor
+    double peakBytes = 0.0;              // memory that the factorisation needed
+    std::vector<std::size_t> nullPivots; // equations whose pivot vanished, ascending
+};
+
+class CSparseFactor {
+public:
+    CSparseFactor();
+    ~CSparseFactor();
+    CSparseFactor(CSparseFactor&&) noexcept;
+    CSparseFactor& operator=(CSparseFactor&&) noexcept;
+
+    /// Symbolic phase for a pattern. block[i]: the block (node) that equation i belongs to, blocks
+    /// counting from 0 in the order of equations; the ordering works on the graph of the blocks.
+    /// 1 done; 0 `reason` filled.
+    [[nodiscard]] int Analyse(const T_SYMMETRIC_MATRIX& matrix, std::span<const int> block,
+                              std::string& reason);
+    /// Numeric phase; the pattern is that of Analyse. Vanishing pivots are no failure: they are
+    /// listed in Info. 1 done; 0 `reason` filled.
+    [[nodiscard]] int Factor(const T_SYMMETRIC_MATRIX& matrix, std::string& reason);
+    /// Solves for `count` right-hand sides, column after column, in place; blocks of up to 64.
+    /// 1 done; 0 `reason` filled, rhs undefined.
+    [[nodiscard]] int Solve(std::span<double> rhs, std::size_t count, std::string& reason);
+    const T_FACTOR_INFO& Info() const;
+
+private:
+    struct T_STATE;
+    std::unique_ptr<T_STATE> m_state;
+};
+
+} // namespace solver
