@@ -79,7 +79,8 @@ B BackboneOf(const T_SKEL_FEMA& f, const T_SIDES<T_SKEL_SIDE>& s)
 {
     return {s.pos,           s.neg,           f.symmetric,
             f.strengthLoss,  f.autoYield,     f.measure == SKEL_MEASURE::DDy,
-            f.initStiffness, f.asymStiffness, &f};
+            f.initStiffness, f.asymStiffness, &f,
+            f.compliance};
 }
 
 constexpr T_RULE_HEAD kCount{"IDS_RPS_MULTI_CURVE_COUNT", kLit, nullptr, nullptr, "curves"};
@@ -174,14 +175,6 @@ std::vector<T_FINDING> CPO_HingeSkcvTabFemaDlg::Findings() const
         });
     }
     return out;
-}
-
-int CPO_HingeSkcvTabFemaDlg::CheckData()
-{
-    const std::vector<T_FINDING> found = Findings();
-    if (found.empty()) return 1;
-    ShowMessage(found.front().messageKey, found.front().text);
-    return 0;
 }
 
 void CPO_HingeSkcvTabFemaDlg::CurveFindings(const T_SKEL_FEMA& curve, T_PLACE place,
