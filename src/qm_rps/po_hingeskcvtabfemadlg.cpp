@@ -125,6 +125,18 @@ std::size_t Index(HINGE_COMPONENT c)
     return static_cast<std::size_t>(c);
 }
 
+/// A value of the curve's own sides and of those of every axial force.
+void SetOnAllSides(T_SKEL_FEMA& curve, double T_SKEL_SIDE::*member, const T_SIDES<double>& value)
+{
+    const auto set = [&](T_SIDES<T_SKEL_SIDE>& s) {
+        s.pos.*member = value.pos;
+        s.neg.*member = value.neg;
+    };
+    set(curve.sides);
+    for (T_SKEL_AXIAL& a : curve.curves)
+        set(a.sides);
+}
+
 const T_SKEL_AXIAL* CurveOfForce(const T_SKEL_FEMA& f, double axial)
 {
     for (const T_SKEL_AXIAL& c : f.curves)
@@ -272,28 +284,28 @@ void CPO_HingeSkcvTabFemaDlg::SetAutoCalcValue(HINGE_COMPONENT c, HINGE_END end,
                                                const T_SIDES<double>& yield)
 {
     T_SKEL_FEMA* curve = Curve(c, end);
-    if (!curve || !curve->autoYield) return;
-    const auto set = [&](T_SIDES<T_SKEL_SIDE>& s) {
-        s.pos.yield = yield.pos;
-        s.neg.yield = yield.neg;
-    };
-    set(curve->sides);
-    for (T_SKEL_AXIAL& a : curve->curves)
-        set(a.sides);
+    if (curve && curve->autoYield) SetOnAllSides(*curve, &T_SKEL_SIDE::yield, yield);
 }
 
 void CPO_HingeSkcvTabFemaDlg::SetYieldDeform(HINGE_COMPONENT c, HINGE_END end,
                                              const T_SIDES<double>& deform)
 {
+    if (T_SKEL_FEMA* curve = Curve(c, end))
+        SetOnAllSides(*curve, &T_SKEL_SIDE::yieldDeform, deform);
+}
+
+int CPO_HingeSkcvTabFemaDlg::OnComplianceChk(HINGE_COMPONENT c, HINGE_END end, bool on)
+{
     T_SKEL_FEMA* curve = Curve(c, end);
-    if (!curve) return;
-    const auto set = [&](T_SIDES<T_SKEL_SIDE>& s) {
-        s.pos.yieldDeform = deform.pos;
-        s.neg.yieldDeform = deform.neg;
-    };
-    set(curve->sides);
-    for (T_SKEL_AXIAL& a : curve->curves)
-        set(a.sides);
+    if (!curve) return 0;
+    curve->compliance = on;
+    return 1;
+}
+
+std::string CPO_HingeSkcvTabFemaDlg::CriterionText(const T_SKEL_FEMA& curve, double value)
+{
+    return curve.compliance ? ShortestText(value)
+                            : zql::lib::MMSGFunction::GetValue("IDS_RPS_PO_FEMA_Inactive");
 }
 
 bool CPO_HingeSkcvTabFemaDlg::IsInfillStrutMode(HINGE_COMPONENT c, HINGE_END end)

@@ -68,6 +68,12 @@ public:
     /// Yield deformations of both sides, magnitudes.
     void SetYieldDeform(HINGE_COMPONENT c, HINGE_END end, const T_SIDES<double>& deform);
 
+    /// The switch "IDS_RPS_PO_FEMA_Compliance_Criteria". Off: the criteria keep their values, but
+    /// are not checked and shown as inactive. 0: no such page.
+    [[nodiscard]] int OnComplianceChk(HINGE_COMPONENT c, HINGE_END end, bool on);
+    /// A criterion as shown.
+    static std::string CriterionText(const T_SKEL_FEMA& curve, double value);
+
     /// Infill panel as a strut: the curve has its own labels.
     bool IsInfillStrutMode(HINGE_COMPONENT c, HINGE_END end);
     void SetInfillStrutMode(HINGE_COMPONENT c, HINGE_END end, bool on);

@@ -73,7 +73,10 @@ void CPO_HingeTypeDlg::SetSection(int section, int material)
 
 int CPO_HingeTypeDlg::OnApply()
 {
-    return CheckData() && m_store && m_store(m_type);
+    if (!CheckData()) return 0;
+    const std::vector<T_FINDING> warnings = HingeTypeWarnings(m_type);
+    if (!warnings.empty()) ShowMessage(warnings.front().messageKey, warnings.front().text);
+    return m_store && m_store(m_type);
 }
 
 void CPO_HingeTypeDlg::OnUpdate(T_HINGE_CONTEXT context)

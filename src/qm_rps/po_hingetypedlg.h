@@ -62,7 +62,8 @@ public:
     void Data2Dlg(const T_PHGT_D& data);
     /// Checks, then writes the whole record. 0: `data` as it was.
     [[nodiscard]] int Dlg2Data(T_PHGT_D& data);
-    /// Checks and stores. 0: a finding was shown, or the document refused.
+    /// Checks and stores; a warning (HingeTypeWarnings) is shown and goes on. 0: a finding was
+    /// shown, or the document refused.
     [[nodiscard]] int OnApply();
     int OnOK() override { return OnApply(); }
     /// The document has changed: options, codes and sections are read again, lists filled again.

@@ -275,4 +275,11 @@ TEST(HingeTypeApply, StoresATypeThatPasses)
     };
     EXPECT_EQ(1, dlg.OnOK());
     EXPECT_EQ("beam", stored.name);
+
+    T_SKEL_MULTI steep;
+    steep.sides.pos.alpha1 = 2;
+    stored.components[1] = stored.components[2] = ComponentWith(SKEL_TYPE::Bilinear, steep);
+    dlg.Data2Dlg(stored);
+    EXPECT_EQ(1, dlg.OnApply());
+    EXPECT_EQ("IDS_RPS_PO_MULTI_WARNING_ALPHA", dlg.Messages().back().key);
 }

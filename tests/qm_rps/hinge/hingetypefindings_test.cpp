@@ -1,6 +1,8 @@
 // Rules of a whole hinge type: what it refers to, codes, symmetry, automatic strengths, parts.
 #include "hingesample.h"
+#include "qm_rps/hingepreview.h"
 #include "qm_rps/hingetypefindings.h"
+#include "qm_rps/po_hingeskcvtabfemadlg.h"
 
 #include <functional>
 #include <gtest/gtest.h>
@@ -199,6 +201,22 @@ TEST(HingeTypeFindings, InactiveCriteriaAreNotChecked)
             {"inactive", [](T& t) { Fema(t).sides.pos.IO = 5, Fema(t).compliance = false; }},
         },
         Context());
+}
+
+TEST(HingeCriteria, AreShownAsInactiveAndLeaveThePicture)
+{
+    CPO_HingeSkcvTabFemaDlg dlg;
+    ASSERT_EQ(1, dlg.Data2Dlg(HINGE_COMPONENT::My, Type().components[4]));
+    const T_SKEL_FEMA& f = *dlg.Curve(HINGE_COMPONENT::My, HINGE_END::Both);
+    T_HINGE_PREVIEW preview;
+    EXPECT_EQ("2", CPO_HingeSkcvTabFemaDlg::CriterionText(f, f.sides.pos.IO));
+    ASSERT_EQ(1, BackboneOf(f, SKEL_TYPE::Fema, preview));
+    EXPECT_EQ(6u, preview.marks.size());
+    EXPECT_EQ(1, dlg.OnComplianceChk(HINGE_COMPONENT::My, HINGE_END::Both, false));
+    EXPECT_EQ(0, dlg.OnComplianceChk(HINGE_COMPONENT::Fx, HINGE_END::Both, false));
+    EXPECT_EQ("Inactive", CPO_HingeSkcvTabFemaDlg::CriterionText(f, f.sides.pos.IO));
+    ASSERT_EQ(1, BackboneOf(f, SKEL_TYPE::Fema, preview));
+    EXPECT_TRUE(preview.marks.empty());
 }
 
 TEST(HingeTypeFindings, PartsOfTheTypeAreCheckedUnderTheirNames)
