@@ -22,6 +22,7 @@ struct T_SYMMETRIC_MATRIX {
 struct T_FACTOR_INFO {
     double factorBytes = 0.0;            // memory of the factor
     double peakBytes = 0.0;              // memory that the factorisation needed
+    std::size_t negativePivots = 0;      // negative eigenvalues (Sylvester's law of inertia)
     std::vector<std::size_t> nullPivots; // equations whose pivot vanished, ascending
 };
 
@@ -41,7 +42,7 @@ public:
     /// listed in Info. 1 done; 0 `reason` filled.
     [[nodiscard]] int Factor(const T_SYMMETRIC_MATRIX& matrix, std::string& reason);
     /// Solves for `count` right-hand sides, column after column, in place; blocks of up to 64.
-    /// 1 done; 0 `reason` filled, rhs undefined.
+    /// The unknown of a vanished pivot is set to 0. 1 done; 0 `reason` filled, rhs undefined.
     [[nodiscard]] int Solve(std::span<double> rhs, std::size_t count, std::string& reason);
     const T_FACTOR_INFO& Info() const;
 
