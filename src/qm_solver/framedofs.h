@@ -2,18 +2,12 @@
 // displacement follows from those.
 #pragma once
 
-#include "qm_solver/frameresult.h"
+#include "qm_solver/constraints.h"
 
 #include <span>
 #include <vector>
 
 namespace solver {
-
-/// One contribution to a displacement: factor times the value at `index`.
-struct T_TERM {
-    int index = 0;
-    double factor = 0.0;
-};
 
 /// u = T q + S g. u: all displacements, full index = 6 * node + direction. q: the unknowns
 /// (equations). g: the prescribed displacements of the supports, indexed as u. Fixed directions,
@@ -26,11 +20,11 @@ struct T_TERM {
 /// springs where their stiffness is not 0. A node that is tied to active ones by a constraint is
 /// active with them.
 ///
-/// State: fixed after Build; may be shared between threads.
+/// State: fixed; may be shared between threads.
 class CFrameDofs {
 public:
-    /// For a checked model (indices in range). 1 done.
-    [[nodiscard]] int Build(const T_FRAME& frame, T_SOLVER_ERROR& error);
+    /// Of a checked model (indices in range).
+    explicit CFrameDofs(const T_FRAME& frame);
 
     std::size_t FullCount() const { return 6 * m_nodes; }
     std::size_t EquationCount() const { return m_owner.size(); }
@@ -46,7 +40,7 @@ public:
     std::span<const int> Blocks() const { return m_block; }
     /// Relations between prescribed displacements alone that the constraints demand: the sum of
     /// factor times displacement of each row must be 0.
-    std::span<const std::vector<T_TERM>> Demands() const { return m_demands; }
+    std::span<const T_RELATION> Demands() const { return m_demands; }
 
     /// u = T q; `full` is overwritten.
     void Expand(std::span<const double> q, std::span<double> full) const;
@@ -69,7 +63,7 @@ private:
     std::vector<char> m_inactive;
     std::vector<std::size_t> m_owner;
     std::vector<int> m_block;
-    std::vector<std::vector<T_TERM>> m_demands;
+    std::vector<T_RELATION> m_demands;
 };
 
 } // namespace solver
