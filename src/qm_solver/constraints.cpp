@@ -7,7 +7,7 @@ namespace solver {
 
 namespace {
 
-constexpr double kDropped = 1e-12; // factors below this, relative to the largest, are round-off
+constexpr double kDropped = 1e-12;  // factors below this, relative to the largest, are round-off
 constexpr double kPivotShare = 0.1; // the first factor of at least this share becomes the pivot
 
 void AddTerm(T_RELATION& sum, T_TERM term)
@@ -61,12 +61,10 @@ void CConstraints::AddDiaphragm(const T_DIAPHRAGM& diaphragm)
         const T_VEC3& at = m_frame.nodes[diaphragm.nodes[k]].xyz;
         const auto axis = [&](int d) { return static_cast<std::size_t>(d); };
         Eliminate({{node + 3 + n, 1.0}, {first + 3 + n, -1.0}});
-        Eliminate({{node + a, 1.0},
-                   {first + a, -1.0},
-                   {first + 3 + n, at[axis(b)] - origin[axis(b)]}});
-        Eliminate({{node + b, 1.0},
-                   {first + b, -1.0},
-                   {first + 3 + n, origin[axis(a)] - at[axis(a)]}});
+        Eliminate(
+            {{node + a, 1.0}, {first + a, -1.0}, {first + 3 + n, at[axis(b)] - origin[axis(b)]}});
+        Eliminate(
+            {{node + b, 1.0}, {first + b, -1.0}, {first + 3 + n, origin[axis(a)] - at[axis(a)]}});
     }
 }
 

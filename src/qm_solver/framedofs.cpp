@@ -15,10 +15,13 @@ void Touch(std::vector<char>& touched, std::size_t node, const T_DIRS6& directio
 T_DIRS6 ActsOn(const T_ELEMENT& element)
 {
     switch (element.kind) {
-    case ELEMENT_KIND::Beam: return {true, true, true, true, true, true};
-    case ELEMENT_KIND::Truss: return {true, true, true, false, false, false};
+    case ELEMENT_KIND::Beam:
+        return {true, true, true, true, true, true};
+    case ELEMENT_KIND::Truss:
+        return {true, true, true, false, false, false};
     case ELEMENT_KIND::Link:
-    case ELEMENT_KIND::Spring: break;
+    case ELEMENT_KIND::Spring:
+        break;
     }
     T_DIRS6 acts{};
     for (std::size_t d = 0; d < 6; ++d)
