@@ -1,5 +1,7 @@
 #include "qm_solver/constraints.h"
 
+#include "qm_solver/frameextent.h"
+
 #include <algorithm>
 #include <cmath>
 
@@ -18,18 +20,6 @@ void AddTerm(T_RELATION& sum, T_TERM term)
         sum.push_back(term);
     else
         at->factor += term.factor;
-}
-
-double Extent(const T_FRAME& frame)
-{
-    T_VEC3 low = frame.nodes.empty() ? T_VEC3{} : frame.nodes[0].xyz, high = low;
-    for (const T_NODE& node : frame.nodes)
-        for (std::size_t d = 0; d < 3; ++d) {
-            low[d] = std::min(low[d], node.xyz[d]);
-            high[d] = std::max(high[d], node.xyz[d]);
-        }
-    const double extent = std::max({high[0] - low[0], high[1] - low[1], high[2] - low[2]});
-    return extent > 0.0 ? extent : 1.0;
 }
 
 } // namespace

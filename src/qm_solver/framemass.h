@@ -7,6 +7,9 @@
 
 namespace solver {
 
+/// density A length of a beam (flexible length) or truss; 0 of others.
+double ElementMass(const T_FRAME& frame, const T_ELEMENT& element);
+
 /// Translational mass by node: the nodal masses and, with density, half of each beam's and
 /// truss's mass (density A length; of a beam the flexible length) at either node. Checked model.
 std::vector<T_VEC3> LumpedMass(const T_FRAME& frame);
