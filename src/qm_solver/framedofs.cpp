@@ -12,6 +12,20 @@ void Touch(std::vector<char>& touched, std::size_t node, const T_DIRS6& directio
         if (directions[d]) touched[6 * node + d] = 1;
 }
 
+/// By full index: 1 where an attached element can give stiffness.
+std::vector<char> Touched(const T_FRAME& frame)
+{
+    std::vector<char> touched(6 * frame.nodes.size(), 0);
+    for (const T_ELEMENT& element : frame.elements) {
+        const T_DIRS6 acts = ActsOn(element);
+        Touch(touched, element.i, acts);
+        if (element.kind != ELEMENT_KIND::Spring) Touch(touched, element.j, acts);
+    }
+    return touched;
+}
+
+} // namespace
+
 T_DIRS6 ActsOn(const T_ELEMENT& element)
 {
     switch (element.kind) {
@@ -28,20 +42,6 @@ T_DIRS6 ActsOn(const T_ELEMENT& element)
         acts[d] = element.stiffness[d] > 0.0;
     return acts;
 }
-
-/// By full index: 1 where an attached element can give stiffness.
-std::vector<char> Touched(const T_FRAME& frame)
-{
-    std::vector<char> touched(6 * frame.nodes.size(), 0);
-    for (const T_ELEMENT& element : frame.elements) {
-        const T_DIRS6 acts = ActsOn(element);
-        Touch(touched, element.i, acts);
-        if (element.kind != ELEMENT_KIND::Spring) Touch(touched, element.j, acts);
-    }
-    return touched;
-}
-
-} // namespace
 
 CFrameDofs::CFrameDofs(const T_FRAME& frame) : m_nodes(frame.nodes.size())
 {

@@ -9,6 +9,9 @@
 
 namespace solver {
 
+/// Directions of an element's nodes to which it can give stiffness (releases notwithstanding).
+T_DIRS6 ActsOn(const T_ELEMENT& element);
+
 /// u = T q + S g. u: all displacements, full index = 6 * node + direction. q: the unknowns
 /// (equations). g: the prescribed displacements of the supports, indexed as u. Fixed directions,
 /// rigid diaphragms and equal displacements are eliminated (master-slave), so T has one entry of 1

@@ -79,7 +79,6 @@ public:
         Control(12) = 1; // order of the matrix itself, not of a compressed one
         Control(13) = 1; // the last block in the same code: exact counts of pivots
         Control(14) = kFirstSlackPct;
-        Control(24) = 1; // null pivots are listed
         Control(27) = static_cast<int>(kRhsBlock);
         Control(28) = 1; // sequential analysis
     }
@@ -245,7 +244,7 @@ struct CSparseFactor::T_STATE {
     }
     void Take(const T_SYMMETRIC_MATRIX& matrix);
     int Analyse(std::string& reason);
-    int Factor(const T_SYMMETRIC_MATRIX& matrix, std::string& reason);
+    int Factor(const T_SYMMETRIC_MATRIX& matrix, PIVOTS pivots, std::string& reason);
     int Solve(std::span<double> rhs, std::size_t count, std::string& reason);
     void ReadInfo();
 };
@@ -282,10 +281,12 @@ int CSparseFactor::T_STATE::Analyse(std::string& reason)
     return 1;
 }
 
-int CSparseFactor::T_STATE::Factor(const T_SYMMETRIC_MATRIX& matrix, std::string& reason)
+int CSparseFactor::T_STATE::Factor(const T_SYMMETRIC_MATRIX& matrix, PIVOTS pivots,
+                                   std::string& reason)
 {
     // The library reads the values and does not write them.
     mumps->Id().a = const_cast<double*>(matrix.value.data());
+    mumps->Control(24) = pivots == PIVOTS::Watch ? 1 : 0;
     int code = mumps->Run(kJobFactor);
     for (int tries = 1; (code == -8 || code == -9) && tries < kMaxTries; ++tries) {
         mumps->Control(14) = 2 * mumps->Control(14) + 50;
@@ -357,7 +358,7 @@ try {
     return 0;
 }
 
-int CSparseFactor::Factor(const T_SYMMETRIC_MATRIX& matrix, std::string& reason)
+int CSparseFactor::Factor(const T_SYMMETRIC_MATRIX& matrix, std::string& reason, PIVOTS pivots)
 try {
     if (!m_state || !m_state->analysed || matrix.Size() != m_state->n ||
         matrix.value.size() != m_state->column.size()) {
@@ -370,7 +371,7 @@ try {
         reason = "the matrix holds a value that is no number";
         return 0;
     }
-    return m_state->n == 0 ? 1 : m_state->Factor(matrix, reason);
+    return m_state->n == 0 ? 1 : m_state->Factor(matrix, pivots, reason);
 } catch (const std::bad_alloc&) {
     reason = "not enough memory to factorise the matrix";
     return 0;

@@ -2,6 +2,7 @@
 
 #include "qm_base/textformat.h"
 #include "qm_solver/directionname.h"
+#include "qm_solver/framedofs.h"
 
 #include <algorithm>
 #include <cmath>
@@ -21,8 +22,6 @@ using Eigen::Vector3d;
 
 constexpr double kRankTolerance = 1.0e-8; // of rows of size 1
 constexpr double kAxisTolerance = 1.0e-6; // a direction this near a global axis is called by it
-constexpr std::array<bool, 6> kBeamActs{true, true, true, true, true, true};
-constexpr std::array<bool, 6> kTrussActs{true, true, true, false, false, false};
 
 /// Which directions of the nodes belong to the part, springs to the ground left aside.
 using TiedDirections = std::vector<T_DIRS6>;
@@ -49,17 +48,7 @@ private:
     std::vector<std::size_t> m_parent;
 };
 
-T_DIRS6 Acts(const T_ELEMENT& element)
-{
-    if (element.kind == ELEMENT_KIND::Beam) return kBeamActs;
-    if (element.kind == ELEMENT_KIND::Truss) return kTrussActs;
-    T_DIRS6 acts{};
-    for (std::size_t d = 0; d < 6; ++d)
-        acts[d] = element.stiffness[d] > 0.0;
-    return acts;
-}
-
-T_DIRS6 Acts(const T_DIAPHRAGM& diaphragm)
+T_DIRS6 ActsOn(const T_DIAPHRAGM& diaphragm)
 {
     const auto normal = static_cast<std::size_t>(diaphragm.normal);
     T_DIRS6 acts{true, true, true, false, false, false};
@@ -147,7 +136,7 @@ void AddSprings(const T_FRAME& frame, const TiedDirections& tied, CParts& parts,
 {
     for (const T_ELEMENT& e : frame.elements) {
         T_PART& part = *partOf[parts.Root(e.i)];
-        const T_DIRS6 acts = Acts(e);
+        const T_DIRS6 acts = ActsOn(e);
         if (e.kind == ELEMENT_KIND::Link) AddDifference(frame, e.i, e.j, acts, part);
         if (e.kind != ELEMENT_KIND::Spring) continue;
         for (std::size_t d = 0; d < 6; ++d)
@@ -216,8 +205,12 @@ std::vector<T_FREE_AXIS> Axes(Matrix3Xd space)
     for (const T_FREE_AXIS& a : axes)
         space -= a.axis * (a.axis.transpose() * space);
     const Matrix3Xd inclined = Basis(space);
-    for (Eigen::Index k = 0; k < inclined.cols(); ++k)
-        axes.push_back({inclined.col(k), -1});
+    for (Eigen::Index k = 0; k < inclined.cols(); ++k) {
+        Eigen::Index largest = 0;
+        inclined.col(k).cwiseAbs().maxCoeff(&largest);
+        const double sign = inclined(largest, k) < 0.0 ? -1.0 : 1.0;
+        axes.push_back({sign * inclined.col(k), -1});
+    }
     return axes;
 }
 
@@ -300,9 +293,9 @@ std::optional<T_SOLVER_ERROR> CheckRigidBodies(const T_FRAME& frame)
     CParts parts(frame.nodes.size());
     TiedDirections tied(frame.nodes.size());
     for (const T_ELEMENT& e : frame.elements)
-        if (e.kind != ELEMENT_KIND::Spring) Connect(std::array{e.i, e.j}, Acts(e), parts, tied);
+        if (e.kind != ELEMENT_KIND::Spring) Connect(std::array{e.i, e.j}, ActsOn(e), parts, tied);
     for (const T_DIAPHRAGM& d : frame.diaphragms)
-        if (!d.nodes.empty()) Connect(d.nodes, Acts(d), parts, tied);
+        if (!d.nodes.empty()) Connect(d.nodes, ActsOn(d), parts, tied);
     for (const T_EQUAL_DISPLACEMENT& e : frame.equalDisplacements)
         if (!e.nodes.empty()) Connect(e.nodes, e.directions, parts, tied);
 
