@@ -4,9 +4,11 @@
 #include "qm_solver/caseblock.h"
 #include "qm_solver/frameassembly.h"
 #include "qm_solver/frameextent.h"
+#include "qm_solver/mechanism.h"
 #include "qm_solver/modelcheck.h"
 #include "qm_solver/sparsefactor.h"
 #include "qm_solver/stabilitycheck.h"
+#include "qm_solver/symmetricproduct.h"
 
 #include <algorithm>
 #include <cmath>
@@ -26,23 +28,6 @@ T_SOLVER_ERROR Failed(std::string reason)
     error.fault = SOLVER_FAULT::Failed;
     error.reason = std::move(reason);
     return error;
-}
-
-/// rest -= matrix times x.
-void SubtractProduct(const T_SYMMETRIC_MATRIX& matrix, std::span<const double> x,
-                     std::span<double> rest)
-{
-    for (std::size_t i = 0; i < matrix.Size(); ++i) {
-        double sum = 0.0;
-        const auto from = static_cast<std::size_t>(matrix.rowStart[i]);
-        const auto to = static_cast<std::size_t>(matrix.rowStart[i + 1]);
-        for (std::size_t k = from; k < to; ++k) {
-            const auto j = static_cast<std::size_t>(matrix.column[k]);
-            sum += matrix.value[k] * x[j];
-            if (j != i) rest[j] -= matrix.value[k] * x[i];
-        }
-        rest[i] -= sum;
-    }
 }
 
 /// The largest force and the largest moment over the unknowns.
@@ -80,7 +65,8 @@ std::optional<T_SOLVER_ERROR> CFrameSolver::T_STATE::Factorise()
     assembly.Assemble(frame);
     if (dofs.EquationCount() == 0) return {}; // everything is held
     if (!factor.Analyse(assembly.Matrix(), dofs.Blocks(), reason)) return Failed(reason);
-    if (!factor.Factor(assembly.Matrix(), reason)) return Failed(reason);
+    T_SOLVER_ERROR error;
+    if (!FactorStable(assembly.Matrix(), dofs, factor, error)) return error;
     return {};
 }
 
@@ -107,8 +93,10 @@ std::optional<T_SOLVER_ERROR> CFrameSolver::T_STATE::SolveBlock(std::span<const 
 
 bool CFrameSolver::T_STATE::Balanced(std::span<const double> loads, std::span<const double> x) const
 {
-    std::vector<double> rest(loads.begin(), loads.end());
-    SubtractProduct(assembly.Matrix(), x, rest);
+    std::vector<double> rest(loads.size());
+    AddProduct<double>(assembly.Matrix(), x, rest);
+    for (std::size_t q = 0; q < rest.size(); ++q)
+        rest[q] -= loads[q];
     const std::array<double, 2> load = Largest(dofs, loads), off = Largest(dofs, rest);
     const double force = std::max(load[0], load[1] / extent);
     return off[0] <= kBalance * force && off[1] <= kBalance * force * extent;
