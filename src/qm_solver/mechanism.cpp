@@ -1,6 +1,6 @@
 #include "qm_solver/mechanism.h"
 
-#include "qm_solver/directionname.h"
+#include "qm_solver/movement.h"
 #include "qm_solver/symmetricproduct.h"
 
 #include <algorithm>
@@ -13,8 +13,6 @@ namespace {
 
 constexpr std::size_t kMaxCandidates = 64; // one block of right-hand sides
 constexpr int kInverseSteps = 2;           // each parts the softest shape by its stiffness ratio
-/// A rotation is named only where translations are this small beside it: they scale with length.
-constexpr double kPureRotation = 1.0e-8;
 
 /// Energy of v within the rounding of the matrix.
 bool MovesFreely(const T_SYMMETRIC_MATRIX& k, std::span<const double> v)
@@ -84,17 +82,6 @@ int SoftestShape(const T_SYMMETRIC_MATRIX& k, CSparseFactor& factor, std::vector
         Normalise(v);
     }
     return 1;
-}
-
-/// Full index of the largest translation, or of the largest rotation if there is no translation.
-std::size_t LargestMovement(std::span<const double> full)
-{
-    std::array<std::size_t, 2> at{0, 3};
-    for (std::size_t i = 0; i < full.size(); ++i) {
-        std::size_t& best = at[i % 6 < 3 ? 0 : 1];
-        if (std::fabs(full[i]) > std::fabs(full[best]) * (1.0 + kPureRotation)) best = i;
-    }
-    return std::fabs(full[at[0]]) > kPureRotation * std::fabs(full[at[1]]) ? at[0] : at[1];
 }
 
 int Fail(T_SOLVER_ERROR& error, std::string reason)
