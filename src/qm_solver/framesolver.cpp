@@ -67,7 +67,7 @@ std::optional<T_SOLVER_ERROR> CFrameSolver::T_STATE::Factorise()
     if (dofs.EquationCount() == 0) return {}; // everything is held
     if (!factor.Analyse(assembly.Matrix(), dofs.Blocks(), reason)) return Failed(reason);
     T_SOLVER_ERROR error;
-    if (!FactorStable(assembly.Matrix(), dofs, factor, error)) return error;
+    if (!FactorStable(frame, dofs, assembly.Matrix(), factor, error)) return error;
     return {};
 }
 

@@ -187,24 +187,6 @@ TEST(Modes, OfARigidSlabSwayAndTurn)
     EXPECT_EQ(2u, Modes(Slab(true), 10).size()); // turning has no mass
 }
 
-/// A tower of beams with nodal and distributed mass, irregular, one foot moved out.
-T_FRAME IrregularTower(std::size_t storeys)
-{
-    T_FRAME frame = Empty();
-    frame.materials[0].density = 7.85;
-    for (std::size_t s = 0; s <= storeys; ++s)
-        for (auto [x, y] : {std::pair{0.0, 0.0}, {5.0, 0.3}, {5.5, 4.0}, {-0.2, 4.4}})
-            AddNode(frame, {x, y, 3.0 * double(s) + 0.1 * x});
-    for (std::size_t n = 0; n + 4 < frame.nodes.size(); ++n) {
-        Join(frame, ELEMENT_KIND::Beam, n, n + 4);
-        Join(frame, ELEMENT_KIND::Beam, n + 4, 4 * (n / 4 + 1) + (n + 1) % 4);
-        frame.nodes[n + 4].mass = {1.0, 1.5, n % 3 ? 0.5 : 0.0};
-    }
-    for (std::size_t n = 0; n < 4; ++n)
-        Fix(frame, n, {X, Y, Z, RX, RY, RZ});
-    return frame;
-}
-
 TEST(Modes, SumUpToTheWholeMassAndAreOrthonormal)
 {
     const T_FRAME frame = IrregularTower(4);
