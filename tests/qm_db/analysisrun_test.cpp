@@ -73,6 +73,25 @@ TEST(AnalysisRun, GivesTheTextbookCantilever)
     EXPECT_EQ(1, post.GetReacNew(10, v)) << post.Error();
 }
 
+// A section given by its dimensions: I = b h3 / 12, whatever values stand beside them; shear areas
+// of a rectangle are 5/6 of its area.
+TEST(AnalysisRun, CalculatesSectionsFromTheirDimensions)
+{
+    T_MODEL_CONTENT content = ContentOf(kCantilever);
+    content.model.sections.at(1).shape = SECT_SHAPE::Rectangle;
+    content.model.sections.at(1).size = {0.3, 0.2, 0, 0};
+    CDBDoc doc;
+    doc.Data().Assign(content);
+    T_ANALYSIS_ERROR error;
+    ASSERT_EQ(1, doc.RunAnalysis({false, {1}, 0, {}}, error)) << error.text;
+    T_DOF6 v{};
+    ASSERT_EQ(1, doc.Post().SelectLoadCombNew(CPostCtrl::MakeLoadComb(1)));
+    ASSERT_EQ(1, doc.Post().GetDispNew(20, v));
+    const double bending = 12.0 * 8 / (3 * 2e8 * 0.2 * 0.027 / 12);
+    const double shear = 12.0 * 2 / (8e7 * 0.06 * 5 / 6); // G = E / 2.5
+    EXPECT_NEAR(-(bending + shear), v[2], 1e-12);
+}
+
 TEST(AnalysisRun, RunsTheCasesThatAreAskedFor)
 {
     CDBDoc doc;
@@ -119,7 +138,9 @@ TEST(AnalysisRun, RefusalsNameIdsAndChangeNothing)
         {[](T_MODEL& m) { m.elements.at(7).section = 5; }, A::BadModel, 0, 7, 0, -1, "beam 7: the section is missing"},
         {[](T_MODEL& m) { m.elements.at(7).nodeJ = 30; }, A::BadModel, 0, 7, 0, -1, "beam 7: there is no node 30"},
         {[](T_MODEL& m) { m.nodes.at(20).xyz = {}; }, A::BadModel, 0, 7, 0, -1, "beam 7: zero length"},
-        {[](T_MODEL& m) { m.sections.at(1).area = -1; }, A::BadModel, 0, 7, 0, -1, "beam 7: the area A of its section is not positive"},
+        {[](T_MODEL& m) { m.sections.at(1).area = -1; }, A::BadModel, 0, 7, 0, -1, "beam 7: section \"B\": "},
+        {[](T_MODEL& m) { m.sections.at(1).area = 0; }, A::BadModel, 0, 7, 0, -1, "beam 7: the area A of its section is not positive"},
+        {[](T_MODEL& m) { m.sections.at(1).shape = SECT_SHAPE::Circle; }, A::BadModel, 0, 7, 0, -1, "beam 7: section \"B\": "},
         {[](T_MODEL& m) { m.elements[9] = m.elements.at(7); m.elements[9].id = 9; }, A::BadModel, 0, 9, 0, -1, "beam 9: another element of the same kind"},
         {[](T_MODEL& m) { m.nodes.at(10).restraint = {1, 1, 1, 0, 0, 0}; }, A::Mechanism, 10, 0, 0, 4, "part of 2 nodes at node 10: the part is free to turn about Y"},
         {[](T_MODEL& m) { m.elements.at(7).release.I[4] = true; }, A::Mechanism, 20, 0, 0, 2, "node 20"},
