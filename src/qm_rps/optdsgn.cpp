@@ -4,7 +4,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/testenvmgr.h"
 #include "qm_db/rps_unknownloadfactormanager.h"
-#include "qm_rps/ulfdump.h"
+#include "qm_rps/optdump.h"
 
 #include <algorithm>
 #include <cmath>
@@ -55,21 +55,21 @@ constexpr T_SIGN_KEYS kExactSign{"IDS_RPS_Load_factor___d__can_be_determined_in_
 constexpr T_SIGN_KEYS kRelaxedSign{"IDS_RPS_Error_code_9___The_load_factors_are_determ_MSG2",
                                    "IDS_RPS_Error_code_9___The_load_factors_are_determ_MSG3"};
 
-int Fail(T_ULF_ANSWER& answer, const char* key, int number = 0)
+int Fail(T_OPT_ANSWER& answer, const char* key, int number = 0)
 {
     std::fill(answer.factors.begin(), answer.factors.end(), 0.0);
     answer.key = key;
     answer.message = MMSGFunction::Format(key, {std::to_string(number)});
     return 0;
 }
-int FailConstraint(T_ULF_ANSWER& answer, const char* key, int number)
+int FailConstraint(T_OPT_ANSWER& answer, const char* key, int number)
 {
     answer.constraint = number;
     return Fail(answer, key, number);
 }
 
 /// A single coefficient, that of row i in column i, is looked at: this diagonal reading is meant.
-const char* PreCheckKey(const T_ULF_ROW& row, std::size_t i, int isign)
+const char* PreCheckKey(const T_OPT_ROW& row, std::size_t i, int isign)
 {
     const double c = row.coefficients[i];
     if (isign == 1 &&
@@ -86,8 +86,8 @@ const char* PreCheckKey(const T_ULF_ROW& row, std::size_t i, int isign)
     return nullptr;
 }
 
-int PreCheck(const std::vector<T_ULF_ROW>& rows, const T_ULF_PROBLEM& problem,
-             T_ULF_ANSWER& answer)
+int PreCheck(const std::vector<T_OPT_ROW>& rows, const T_OPT_PROBLEM& problem,
+             T_OPT_ANSWER& answer)
 {
     if (!problem.solveByEquations || CTestEnvMgr::IsTestEnvST("KTR_ULF_TEST", "yes")) return 1;
     const std::size_t checked = std::min(rows.size(), static_cast<std::size_t>(problem.nvar));
@@ -98,9 +98,9 @@ int PreCheck(const std::vector<T_ULF_ROW>& rows, const T_ULF_PROBLEM& problem,
 }
 
 /// Equalities first, then inequalities, each in input order, with "at least" turned round.
-T_ULF_SYSTEM SystemOf(const std::vector<T_ULF_ROW>& rows, const T_ULF_PROBLEM& problem)
+T_OPT_SYSTEM SystemOf(const std::vector<T_OPT_ROW>& rows, const T_OPT_PROBLEM& problem)
 {
-    T_ULF_SYSTEM s;
+    T_OPT_SYSTEM s;
     s.ncon = static_cast<int>(rows.size());
     s.nvar = problem.nvar;
     s.order.resize(rows.size());
@@ -110,20 +110,20 @@ T_ULF_SYSTEM SystemOf(const std::vector<T_ULF_ROW>& rows, const T_ULF_PROBLEM& p
                                              [&](int i) { return relation(i) == 0; });
     s.neq = static_cast<int>(split - s.order.begin());
     for (const int i : s.order) {
-        const T_ULF_ROW& row = rows[static_cast<std::size_t>(i)];
+        const T_OPT_ROW& row = rows[static_cast<std::size_t>(i)];
         const double turn = row.relation == 1 ? -1.0 : 1.0;
         for (const double c : row.coefficients)
             s.matrix.push_back(turn * c);
         s.rhs.push_back(turn * row.rhs);
         s.relations.push_back(row.relation);
     }
-    for (const T_ULF_ITEM& item : problem.items)
+    for (const T_OPT_ITEM& item : problem.items)
         if (IsUnknownItem(item)) s.weights.push_back(item[2]);
     return s;
 }
 
 /// The first factor with the wrong sign fails the run.
-int CheckSigns(int isign, const T_SIGN_KEYS& keys, T_ULF_ANSWER& answer)
+int CheckSigns(int isign, const T_SIGN_KEYS& keys, T_OPT_ANSWER& answer)
 {
     if (isign == 0) return 1;
     const auto wrong = std::find_if(answer.factors.begin(), answer.factors.end(),
@@ -134,9 +134,9 @@ int CheckSigns(int isign, const T_SIGN_KEYS& keys, T_ULF_ANSWER& answer)
 }
 
 /// Code 9: factors were found, but a row may be met only within a relaxed tolerance.
-int CheckRelaxed(int isign, T_ULF_ANSWER& answer)
+int CheckRelaxed(int isign, T_OPT_ANSWER& answer)
 {
-    const T_ULF_SYSTEM& s = answer.system;
+    const T_OPT_SYSTEM& s = answer.system;
     for (int row = s.neq; row < s.ncon; ++row) {
         const auto at = static_cast<std::size_t>(row);
         const double sum = std::inner_product(answer.factors.begin(), answer.factors.end(),
@@ -159,7 +159,7 @@ int COptDsgn::IsSolverRunning()
     return g_solverRunning;
 }
 
-int COptDsgn::CheckProblem(const T_ULF_PROBLEM& problem, T_ULF_ANSWER& answer) const
+int COptDsgn::CheckProblem(const T_OPT_PROBLEM& problem, T_OPT_ANSWER& answer) const
 {
     if (problem.iobj < 1 || problem.iobj > 3) return Fail(answer, kUnknownObjective);
     const auto unknown = std::count_if(problem.items.begin(), problem.items.end(), IsUnknownItem);
@@ -168,8 +168,8 @@ int COptDsgn::CheckProblem(const T_ULF_PROBLEM& problem, T_ULF_ANSWER& answer) c
     return Fail(answer, "IDS_QM_ULF_BAD_PROBLEM");
 }
 
-int COptDsgn::ReadRows(const T_ULF_PROBLEM& problem, std::vector<T_ULF_ROW>& rows,
-                       T_ULF_ANSWER& answer)
+int COptDsgn::ReadRows(const T_OPT_PROBLEM& problem, std::vector<T_OPT_ROW>& rows,
+                       T_OPT_ANSWER& answer)
 {
     IUlfResponse& source = problem.stage ? *m_stage : m_static;
     if (!BuildRows(problem.items, problem.constraints, source, rows, answer.coefficients)) {
@@ -188,26 +188,26 @@ int COptDsgn::ReadRows(const T_ULF_PROBLEM& problem, std::vector<T_ULF_ROW>& row
     return 1;
 }
 
-int COptDsgn::Run(const T_ULF_PROBLEM& problem, T_ULF_ANSWER& answer)
+int COptDsgn::Run(const T_OPT_PROBLEM& problem, T_OPT_ANSWER& answer)
 {
     answer = {};
     answer.factors.assign(static_cast<std::size_t>(std::max(0, problem.nvar)), 0.0);
-    std::vector<T_ULF_ROW> rows;
+    std::vector<T_OPT_ROW> rows;
     if (!CheckProblem(problem, answer) || !ReadRows(problem, rows, answer) ||
         !PreCheck(rows, problem, answer))
         return 0;
-    T_ULF_SYSTEM system = SystemOf(rows, problem);
+    T_OPT_SYSTEM system = SystemOf(rows, problem);
     answer.exact = system.neq == system.nvar && system.ncon == system.nvar;
     if (!answer.exact && problem.solveByEquations)
         return Fail(answer, "IDS_RPS_NOT_SOLVED_SIMUL_EQ_METHOD");
     answer.system = std::move(system);
-    if (m_dump.enabled) WriteUlfDump(m_dump, answer, problem.iobj, problem.isign);
+    if (m_dump.enabled) WriteOptDump(m_dump, answer, problem.iobj, problem.isign);
     return answer.exact ? SolveExact(problem, answer) : SolveOptimum(problem, answer);
 }
 
-int COptDsgn::CallSolver(const T_ULF_PROBLEM& problem, T_ULF_ANSWER& answer)
+int COptDsgn::CallSolver(const T_OPT_PROBLEM& problem, T_OPT_ANSWER& answer)
 {
-    const T_ULF_SYSTEM& s = answer.system;
+    const T_OPT_SYSTEM& s = answer.system;
     try {
         return m_solver(answer.exact ? 0 : 1, s.ncon, s.nvar, s.neq, s.matrix.data(), s.rhs.data(),
                         answer.factors.data(), s.weights.data(), problem.iobj, problem.isign,
@@ -220,13 +220,13 @@ int COptDsgn::CallSolver(const T_ULF_PROBLEM& problem, T_ULF_ANSWER& answer)
     }
 }
 
-int COptDsgn::SolveExact(const T_ULF_PROBLEM& problem, T_ULF_ANSWER& answer)
+int COptDsgn::SolveExact(const T_OPT_PROBLEM& problem, T_OPT_ANSWER& answer)
 {
     CallSolver(problem, answer); // its return is not used, on purpose: residuals tell what holds
     return CheckSigns(problem.isign, kExactSign, answer);
 }
 
-int COptDsgn::SolveOptimum(const T_ULF_PROBLEM& problem, T_ULF_ANSWER& answer)
+int COptDsgn::SolveOptimum(const T_OPT_PROBLEM& problem, T_OPT_ANSWER& answer)
 {
     int solved = 0;
     {

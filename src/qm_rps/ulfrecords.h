@@ -15,15 +15,15 @@ struct T_ULF_CASE {
 };
 
 /// Key, known factor (0 of an unknown case), weight (1 of a known case), 0.
-T_ULF_ITEM UlfItemRecord(const T_ULF_CASE& loadCase);
+T_OPT_ITEM UlfItemRecord(const T_ULF_CASE& loadCase);
 
 /// One record of an equality or a single bound; two of an inequality with both bounds, first the
 /// upper, then the lower one; none of an inequality without bounds.
-std::vector<T_ULF_RECORD> UlfConstraintRecords(const T_ULFC_D& constraint);
+std::vector<T_OPT_RECORD> UlfConstraintRecords(const T_ULFC_D& constraint);
 
 /// The problem of an item, with the way back from its records to constraints and cases.
 struct T_ULF_FORMED {
-    T_ULF_PROBLEM problem;
+    T_OPT_PROBLEM problem;
     std::vector<std::size_t> owner;    // record -> constraint
     std::vector<std::size_t> unknowns; // unknown -> load case
 };

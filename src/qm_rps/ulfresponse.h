@@ -10,15 +10,15 @@
 /// Load case item of the optimizer. Static: 0 key of the load case, 1 known factor (below 1e-12 in
 /// absolute value: unknown), 2 weight of an unknown case, 3 unused. Construction stage: 0 stage and
 /// step whose results are read, 3 load group. Integers are stored as doubles.
-using T_ULF_ITEM = std::array<double, 4>;
+using T_OPT_ITEM = std::array<double, 4>;
 
 /// A response quantity of the structure.
-struct T_ULF_QUANTITY {
+struct T_OPT_QUANTITY {
     int kind = 0;      // 1 displacement, 2 reaction of a node, 3 force of a truss, 4 of a beam
     int id = 0;        // node or element
     int position = 0;  // of a beam, 1 I-end to 5 J-end; else 0
     int component = 0; // from 1
-    auto operator<=>(const T_ULF_QUANTITY&) const = default;
+    auto operator<=>(const T_OPT_QUANTITY&) const = default;
 };
 
 class IUlfResponse {
@@ -32,8 +32,8 @@ public:
     /// out[q * items.size() + i] is quantity q under item i. All at once, so that a source may
     /// select an item once and read everything of it. 1 done; 0 one of them can't be had or is not
     /// finite, Error() says which, `out` is not defined.
-    [[nodiscard]] virtual int Read(std::span<const T_ULF_ITEM> items,
-                                   std::span<const T_ULF_QUANTITY> what,
+    [[nodiscard]] virtual int Read(std::span<const T_OPT_ITEM> items,
+                                   std::span<const T_OPT_QUANTITY> what,
                                    std::span<double> out) = 0;
     /// Why the latest Read failed, in words.
     virtual std::string Error() const = 0;

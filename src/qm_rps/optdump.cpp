@@ -1,4 +1,4 @@
-#include "qm_rps/ulfdump.h"
+#include "qm_rps/optdump.h"
 
 #include "qm_base/logfile.h"
 #include "qm_base/textformat.h"
@@ -22,7 +22,7 @@ std::string Listed(const char* name, const std::vector<double>& values)
 
 } // namespace
 
-std::string UlfDumpText(const T_ULF_SYSTEM& s, bool exact, int iobj, int isign)
+std::string OptDumpText(const T_OPT_SYSTEM& s, bool exact, int iobj, int isign)
 {
     std::string text = kRule;
     text += std::string(kIndent) + "UNKNOWN LOAD FACTOR : " + (exact ? "SOLVE" : "OPTIMIZED") +
@@ -35,17 +35,17 @@ std::string UlfDumpText(const T_ULF_SYSTEM& s, bool exact, int iobj, int isign)
     return text + Listed("COEFVEC", s.matrix);
 }
 
-std::string UlfDumpPath(const std::string& modelPath, bool exact)
+std::string OptDumpPath(const std::string& modelPath, bool exact)
 {
     return FormatText("%s_%s.%s",
                       CFileCtrl::GetFilePathAndNameWithoutExtension(modelPath).c_str(),
                       exact ? "[EXACT]" : "[OPTIMIZE]", "out");
 }
 
-void WriteUlfDump(const T_ULF_DUMP& dump, const T_ULF_ANSWER& answer, int iobj, int isign)
+void WriteOptDump(const T_OPT_DUMP& dump, const T_OPT_ANSWER& answer, int iobj, int isign)
 {
-    const std::string path = UlfDumpPath(dump.modelPath, answer.exact);
-    const std::string text = UlfDumpText(answer.system, answer.exact, iobj, isign);
+    const std::string path = OptDumpPath(dump.modelPath, answer.exact);
+    const std::string text = OptDumpText(answer.system, answer.exact, iobj, isign);
     std::error_code ignored;
     const bool add = std::filesystem::exists(path, ignored) && !(dump.overwrite && dump.overwrite());
     T_FILE_ERROR error;

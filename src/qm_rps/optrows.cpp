@@ -1,4 +1,4 @@
-#include "qm_rps/ulfrows.h"
+#include "qm_rps/optrows.h"
 
 #include <algorithm>
 #include <cmath>
@@ -11,7 +11,7 @@ constexpr int kBeam = 4;
 
 } // namespace
 
-bool IsUnknownItem(const T_ULF_ITEM& item)
+bool IsUnknownItem(const T_OPT_ITEM& item)
 {
     return std::fabs(item[1]) < kUnknownBelow;
 }
@@ -22,12 +22,12 @@ int Truncated(double value)
     return value >= -most && value <= most ? static_cast<int>(value) : 0;
 }
 
-std::optional<T_ULF_READING> ReadRecord(const T_ULF_RECORD& record)
+std::optional<T_OPT_READING> ReadRecord(const T_OPT_RECORD& record)
 {
     const int kind = Truncated(record[0]);
     if (kind < 1 || kind > kBeam) return std::nullopt;
     const std::size_t shift = kind == kBeam ? 1 : 0; // the position stands before the component
-    T_ULF_READING r;
+    T_OPT_READING r;
     r.first = {kind, Truncated(record[1]), shift ? Truncated(record[2]) : 0,
                Truncated(record[2 + shift])};
     r.value = record[3 + shift];
@@ -39,11 +39,11 @@ std::optional<T_ULF_READING> ReadRecord(const T_ULF_RECORD& record)
     return r;
 }
 
-T_ULF_ROW BuildRow(std::span<const T_ULF_ITEM> items, const T_ULF_READING& reading,
+T_OPT_ROW BuildRow(std::span<const T_OPT_ITEM> items, const T_OPT_READING& reading,
                    std::span<const double> r1, std::span<const double> r2,
                    std::vector<double>& coefficients)
 {
-    T_ULF_ROW row{{}, r2.empty() ? reading.value : 0.0, reading.relation};
+    T_OPT_ROW row{{}, r2.empty() ? reading.value : 0.0, reading.relation};
     coefficients.resize(items.size());
     for (std::size_t i = 0; i < items.size(); ++i) {
         const double response = r2.empty() ? r1[i] : r1[i] - r2[i];
@@ -56,13 +56,13 @@ T_ULF_ROW BuildRow(std::span<const T_ULF_ITEM> items, const T_ULF_READING& readi
     return row;
 }
 
-int BuildRows(std::span<const T_ULF_ITEM> items, std::span<const T_ULF_RECORD> constraints,
-              IUlfResponse& source, std::vector<T_ULF_ROW>& rows,
+int BuildRows(std::span<const T_OPT_ITEM> items, std::span<const T_OPT_RECORD> constraints,
+              IUlfResponse& source, std::vector<T_OPT_ROW>& rows,
               std::vector<std::vector<double>>& coefficients)
 {
-    std::vector<std::optional<T_ULF_READING>> readings;
-    std::vector<T_ULF_QUANTITY> what;
-    for (const T_ULF_RECORD& record : constraints) {
+    std::vector<std::optional<T_OPT_READING>> readings;
+    std::vector<T_OPT_QUANTITY> what;
+    for (const T_OPT_RECORD& record : constraints) {
         readings.push_back(ReadRecord(record));
         if (!readings.back()) continue;
         what.push_back(readings.back()->first);
