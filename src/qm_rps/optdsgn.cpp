@@ -72,13 +72,11 @@ int FailConstraint(T_OPT_ANSWER& answer, const char* key, int number)
 const char* PreCheckKey(const T_OPT_ROW& row, std::size_t i, int isign)
 {
     const double c = row.coefficients[i];
-    if (isign == 1 &&
-        ((c > 0 && row.rhs <= 0 && row.relation != 1) ||
-         (c < 0 && row.rhs >= 0 && row.relation != -1)))
+    if (isign == 1 && ((c > 0 && row.rhs <= 0 && row.relation != 1) ||
+                       (c < 0 && row.rhs >= 0 && row.relation != -1)))
         return "IDS_RPS_Constraint___d__cannot_be_satisfied_with_t";
-    if (isign == -1 &&
-        ((c > 0 && row.rhs >= 0 && row.relation != -1) ||
-         (c < 0 && row.rhs <= 0 && row.relation != 1)))
+    if (isign == -1 && ((c > 0 && row.rhs >= 0 && row.relation != -1) ||
+                        (c < 0 && row.rhs <= 0 && row.relation != 1)))
         return "IDS_RPS_Constraint___d__cannot_be_satisfied_with_t_MSG1";
     // No absolute value is below this bound, so the message is never shown: this is meant.
     if (row.relation == 0 && std::fabs(c) <= -1.0)
@@ -86,8 +84,7 @@ const char* PreCheckKey(const T_OPT_ROW& row, std::size_t i, int isign)
     return nullptr;
 }
 
-int PreCheck(const std::vector<T_OPT_ROW>& rows, const T_OPT_PROBLEM& problem,
-             T_OPT_ANSWER& answer)
+int PreCheck(const std::vector<T_OPT_ROW>& rows, const T_OPT_PROBLEM& problem, T_OPT_ANSWER& answer)
 {
     if (!problem.solveByEquations || CTestEnvMgr::IsTestEnvST("KTR_ULF_TEST", "yes")) return 1;
     const std::size_t checked = std::min(rows.size(), static_cast<std::size_t>(problem.nvar));

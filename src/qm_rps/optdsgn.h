@@ -22,11 +22,11 @@ struct T_OPT_PROBLEM {
 /// inequality turned to "at most".
 struct T_OPT_SYSTEM {
     int ncon = 0, nvar = 0, neq = 0;
-    std::vector<double> matrix; // row-major, ncon x nvar
-    std::vector<double> rhs;    // ncon
+    std::vector<double> matrix;  // row-major, ncon x nvar
+    std::vector<double> rhs;     // ncon
     std::vector<double> weights; // nvar
-    std::vector<int> order;     // row -> index of the constraint record
-    std::vector<int> relations; // row -> relation of the record before it was turned
+    std::vector<int> order;      // row -> index of the constraint record
+    std::vector<int> relations;  // row -> relation of the record before it was turned
     bool operator==(const T_OPT_SYSTEM&) const = default;
 };
 
@@ -56,10 +56,9 @@ public:
     /// The solver's interface, see CRps_UnknownLoadFactorManager::Calc_UnknownLoadFactor: mode (1
     /// optimise, 0 equations), NCON, NVAR, NEQ, matrix, right-hand sides, factors (written),
     /// weights, IOBJ, ISIGN, error code (written). Not 0: done.
-    using Solver =
-        std::function<int(int mode, int ncon, int nvar, int neq, const double* matrix,
-                          const double* rhs, double* factors, const double* weights, int iobj,
-                          int isign, int* code)>;
+    using Solver = std::function<int(int mode, int ncon, int nvar, int neq, const double* matrix,
+                                     const double* rhs, double* factors, const double* weights,
+                                     int iobj, int isign, int* code)>;
 
     /// Sources of responses; not owned, must outlive this object. A construction-stage problem
     /// needs the second one.

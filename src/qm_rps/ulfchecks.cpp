@@ -57,7 +57,8 @@ bool Compared(const C& k)
 bool IsKind(const C& k, int id, ELEM_KIND kind)
 {
     const auto it = k.model.elements.find(id);
-    return it == k.model.elements.end() || it->second.kind == kind; // a missing one has its own rule
+    return it == k.model.elements.end() ||
+           it->second.kind == kind; // a missing one has its own rule
 }
 bool Finite(const std::optional<double>& value)
 {
@@ -190,8 +191,7 @@ std::vector<T_FINDING> CheckUlfItem(const T_ULFI_D& item, int ownKey, const T_MO
 
 int FindUlfConstraint(const T_MODEL& model, const std::string& name)
 {
-    const auto it =
-        std::find_if(model.ulfConstraints.begin(), model.ulfConstraints.end(),
-                     [&](const auto& row) { return row.second.name == name; });
+    const auto it = std::find_if(model.ulfConstraints.begin(), model.ulfConstraints.end(),
+                                 [&](const auto& row) { return row.second.name == name; });
     return it == model.ulfConstraints.end() ? 0 : it->first;
 }

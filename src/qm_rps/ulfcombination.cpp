@@ -15,10 +15,9 @@ constexpr std::size_t kMostEntries = 999;
 int Add(CDBDoc& doc, const T_LCOM_D& combination)
 {
     const int added = doc.Data().AddLcom(combination) != 0;
-    const std::string text =
-        MMSGFunction::Format(added ? "IDS_RPS_UNKNOWN_LOAD_LCOM_SUCCESS"
-                                   : "IDS_RPS_UNKNOWN_LOAD_LCOM_FAIL",
-                             {combination.name});
+    const std::string text = MMSGFunction::Format(added ? "IDS_RPS_UNKNOWN_LOAD_LCOM_SUCCESS"
+                                                        : "IDS_RPS_UNKNOWN_LOAD_LCOM_FAIL",
+                                                  {combination.name});
     GSaveHistoryFormatNF("%s", text.c_str());
     return added;
 }

@@ -10,7 +10,8 @@ constexpr double kNotRead = std::numeric_limits<double>::quiet_NaN();
 
 } // namespace
 
-CUlfInfluenceCache::CUlfInfluenceCache(IUlfResponse& source, std::function<std::uint64_t()> revision)
+CUlfInfluenceCache::CUlfInfluenceCache(IUlfResponse& source,
+                                       std::function<std::uint64_t()> revision)
     : m_source(source), m_revision(std::move(revision))
 {
 }

@@ -33,8 +33,7 @@ public:
     /// select an item once and read everything of it. 1 done; 0 one of them can't be had or is not
     /// finite, Error() says which, `out` is not defined.
     [[nodiscard]] virtual int Read(std::span<const T_OPT_ITEM> items,
-                                   std::span<const T_OPT_QUANTITY> what,
-                                   std::span<double> out) = 0;
+                                   std::span<const T_OPT_QUANTITY> what, std::span<double> out) = 0;
     /// Why the latest Read failed, in words.
     virtual std::string Error() const = 0;
 };

@@ -61,9 +61,9 @@ int CUlfStaticResponse::Read(std::span<const T_OPT_ITEM> items,
         if (ok) continue;
         T_STLD_D record;
         const bool known = m_doc.Attr().GetStld(loadCase, record) != 0;
-        m_error = MMSGFunction::Format("IDS_QM_ULF_CASE_NOT_READ",
-                                       {known ? record.name : std::to_string(loadCase),
-                                        post.Error()});
+        m_error =
+            MMSGFunction::Format("IDS_QM_ULF_CASE_NOT_READ",
+                                 {known ? record.name : std::to_string(loadCase), post.Error()});
         return 0;
     }
     return 1;

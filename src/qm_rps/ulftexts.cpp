@@ -12,13 +12,12 @@ namespace {
 
 constexpr std::array<const char*, 6> kDisplacements{"DX", "DY", "DZ", "RX", "RY", "RZ"};
 constexpr std::array<const char*, 6> kReactions{"FX", "FY", "FZ", "MX", "MY", "MZ"};
-constexpr std::array<const char*, 6> kForces{"IDS_RPS_Axial",   "IDS_RPS_Shear_Y",
-                                             "IDS_RPS_Shear_Z", "IDS_RPS_Torsion",
+constexpr std::array<const char*, 6> kForces{"IDS_RPS_Axial",    "IDS_RPS_Shear_Y",
+                                             "IDS_RPS_Shear_Z",  "IDS_RPS_Torsion",
                                              "IDS_RPS_Moment_Y", "IDS_RPS_Moment_Z"};
 constexpr std::array<const char*, 5> kPositions{
-    "IDS_RPS_UNKNOWN_TABLE_I_END", "IDS_RPS_UNKNOWN_TABLE_1_4_Pos",
-    "IDS_RPS_UNKNOWN_TABLE_2_4_Pos", "IDS_RPS_UNKNOWN_TABLE_3_4_Pos",
-    "IDS_RPS_UNKNOWN_TABLE_J_END"};
+    "IDS_RPS_UNKNOWN_TABLE_I_END", "IDS_RPS_UNKNOWN_TABLE_1_4_Pos", "IDS_RPS_UNKNOWN_TABLE_2_4_Pos",
+    "IDS_RPS_UNKNOWN_TABLE_3_4_Pos", "IDS_RPS_UNKNOWN_TABLE_J_END"};
 
 const char* At(std::span<const char* const> names, int index)
 {

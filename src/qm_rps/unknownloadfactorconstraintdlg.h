@@ -9,9 +9,9 @@
 class CUnknownLoadFactorConstraintDlg : public zql::frx::MDialog {
 public:
     /// Texts of the types, by code; of the place that an equality is compared with, likewise.
-    static constexpr std::array<const char*, 4> kTypeKeys{
-        "IDS_QM_ULFC_REACTION", "IDS_QM_ULFC_DISPLACEMENT", "IDS_QM_ULFC_TRUSS",
-        "IDS_QM_ULFC_BEAM"};
+    static constexpr std::array<const char*, 4> kTypeKeys{"IDS_QM_ULFC_REACTION",
+                                                          "IDS_QM_ULFC_DISPLACEMENT",
+                                                          "IDS_QM_ULFC_TRUSS", "IDS_QM_ULFC_BEAM"};
     static constexpr std::array<const char*, 4> kOtherKeys{
         "IDS_RPS_Other_Node", "IDS_RPS_Other_Node", "IDS_RPS_Other_Truss", "IDS_RPS_Other_Beam"};
 

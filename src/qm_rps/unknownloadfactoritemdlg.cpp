@@ -24,7 +24,8 @@ void WriteHistory(const char* key)
 } // namespace
 
 CUnknownLoadFactorItemDlg::CUnknownLoadFactorItemDlg(CDBDoc& doc, int key)
-    : m_doc(doc), m_key(key), m_source(doc), m_cache(m_source, [this] { return m_source.Revision(); })
+    : m_doc(doc), m_key(key), m_source(doc),
+      m_cache(m_source, [this] { return m_source.Revision(); })
 {
     T_ULFI_D item;
     if (!m_doc.Attr().GetUlfi(key, item)) {
@@ -75,9 +76,8 @@ void CUnknownLoadFactorItemDlg::OnSelChangeCombination(int key)
             T_STLD_D loadCase;
             if (!m_doc.Attr().GetStld(entry.key, loadCase)) continue;
             T_ULF_CASE row{entry.key, loadCase.name, entry.factor};
-            const auto it = std::find_if(before.begin(), before.end(), [&](const auto& u) {
-                return u.loadCase == entry.key;
-            });
+            const auto it = std::find_if(before.begin(), before.end(),
+                                         [&](const auto& u) { return u.loadCase == entry.key; });
             if (it != before.end()) {
                 row.unknown = true;
                 row.weight = it->weight;
@@ -192,7 +192,8 @@ int CUnknownLoadFactorItemDlg::OnCalculate()
     if (!CheckData() || !ReadRun(run)) return 0;
 
     COptDsgn optimizer(m_cache);
-    optimizer.m_dump = {m_dump, m_doc.Path(), [this] { return AskYesNo("IDS_QM_ULF_DUMP_EXISTS"); }};
+    optimizer.m_dump = {m_dump, m_doc.Path(),
+                        [this] { return AskYesNo("IDS_QM_ULF_DUMP_EXISTS"); }};
     std::vector<std::vector<double>> influence;
     const bool solved = optimizer.Run(run.formed.problem, run.answer) &&
                         ReadUlfInfluence(run.cases, run.constraints, m_cache, influence);

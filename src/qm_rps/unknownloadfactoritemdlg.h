@@ -19,8 +19,8 @@ public:
     /// Texts of the choices, by index.
     static constexpr std::array<const char*, 3> kObjectiveKeys{
         "IDS_QM_ULF_LINEAR", "IDS_QM_ULF_SQUARE", "IDS_QM_ULF_MIN_MAX"};
-    static constexpr std::array<const char*, 3> kSignKeys{
-        "IDS_QM_ULF_NEGATIVE", "IDS_QM_ULF_FREE", "IDS_QM_ULF_POSITIVE"};
+    static constexpr std::array<const char*, 3> kSignKeys{"IDS_QM_ULF_NEGATIVE", "IDS_QM_ULF_FREE",
+                                                          "IDS_QM_ULF_POSITIVE"};
 
     struct T_CHECK {
         std::string name; // of a constraint of the model

@@ -9,8 +9,8 @@
 class CUnknownLoadFactorResultDlg : public zql::frx::MDialog {
 public:
     /// Heads of the table of load cases and of that of constraints.
-    static constexpr std::array<const char*, 2> kFactorHeads{"IDS_RPS_GXGRID_LCase",
-                                                             "IDS_RPS_UNKNOWN_LOAD_GXRESULT_Factor"};
+    static constexpr std::array<const char*, 2> kFactorHeads{
+        "IDS_RPS_GXGRID_LCase", "IDS_RPS_UNKNOWN_LOAD_GXRESULT_Factor"};
     static constexpr std::array<const char*, 6> kConstraintHeads{
         "IDS_RPS_UNKNOWN_LOAD_GXRESULT_Constraint",
         "IDS_RPS_UNKNOWN_LOAD_GXRESULT_Value",
