@@ -172,8 +172,6 @@ TEST_F(UnknownLoadFactor, SolvesAgainAfterOtherBoundsAndAfterOtherResults)
     EXPECT_NEAR(0.1, UlfValue(*dlg.Result(), 0), 1e-12);
     EXPECT_EQ(before, source.Revision()); // the cache lives on
 
-    T_STATIC_DATA data =
-        five::Results(m_doc.Data().Content().staticResults.at(1)->Fingerprint(), 1);
     T_MODEL_CONTENT content = m_doc.Data().Content();
     content.model.styp.units.length = LENGTH_UNIT::mm;
     m_doc.Data().Assign(content);
@@ -249,7 +247,9 @@ TEST_F(UnknownLoadFactor, ItemReportsEachRuleInOrder)
         const std::vector<T_FINDING> found = dlg.Findings();
         ASSERT_FALSE(found.empty()) << c.label;
         EXPECT_EQ(key, found[0].messageKey) << c.label;
-        if (*c.rule) EXPECT_EQ(c.rule, found[0].ruleText) << c.label;
+        if (*c.rule) {
+            EXPECT_EQ(c.rule, found[0].ruleText) << c.label;
+        }
         EXPECT_EQ(found[0].text, dlg.Messages()[0].text) << c.label;
         EXPECT_EQ(std::string::npos, found[0].text.find_first_of("{}")) << found[0].text;
         EXPECT_EQ(0, dlg.OnOK()) << c.label;
@@ -347,7 +347,9 @@ TEST_F(UnknownLoadFactor, ConstraintReportsEachRuleInOrder)
         const std::vector<T_FINDING> found = dlg.Findings();
         ASSERT_FALSE(found.empty()) << c.label;
         EXPECT_EQ(key, found[0].messageKey) << c.label;
-        if (*c.rule) EXPECT_EQ(c.rule, found[0].ruleText) << c.label;
+        if (*c.rule) {
+            EXPECT_EQ(c.rule, found[0].ruleText) << c.label;
+        }
         EXPECT_EQ(found[0].text, dlg.Messages()[0].text) << c.label;
         EXPECT_EQ(std::string::npos, found[0].text.find_first_of("{}")) << found[0].text;
         EXPECT_EQ(0, dlg.OnOK()) << c.label;
@@ -532,7 +534,7 @@ TEST_F(UnknownLoadFactor, ExportsTheSheetOrSaysWhyNot)
     T_ULF_RESULT wide = *item.Result();
     wide.constraints.resize(231);
     CUnknownLoadFactorResultDlg old(m_doc, wide);
-    EXPECT_EQ(0, old.OnExport(path, {11}));
+    EXPECT_EQ(0, old.OnExport(path, {11, 0, 0, 0, {}}));
     EXPECT_EQ("IDS_RPS_UNKNOWN_LOAD_EXCEED_COLUMN_ERROR", old.Messages().back().key);
     EXPECT_FALSE(std::filesystem::exists(path));
 }
