@@ -1,11 +1,11 @@
 # Compiles every public header of the rooms alone, so that none leans on another's includes.
 set(header_sources)
-set(rooms qm_base qm_db qm_cmd qm_rps)
+set(rooms qm_base qm_solver qm_db qm_cmd qm_rps)
 if(QM_UI)
   list(APPEND rooms qm_ui)
 endif()
 # Headers that only the sources of their own room include are not public.
-set(internal "qm_db/(json|case[a-z]+[.]h|sqlite|recordcodec|recordbody|modelschema|modelreader|resultblock|recorderfile|checksum|filehandle|modellock|modeltemp|storefault|hingefields|hingenames)")
+set(internal "qm_db/(json|case[a-z]+[.]h|sqlite|recordcodec|recordbody|modelschema|modelreader|resultblock|recorderfile|checksum|filehandle|modellock|modeltemp|storefault|hingefields|hingenames|structfields|structnames|loadfields|staticblocks)")
 foreach(room ${rooms})
   file(GLOB headers RELATIVE ${PROJECT_SOURCE_DIR}/src ${PROJECT_SOURCE_DIR}/src/${room}/*.h)
   foreach(header ${headers})
