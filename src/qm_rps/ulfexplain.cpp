@@ -48,8 +48,9 @@ public:
 private:
     T_ULF_PROBLEM Problem(int sign) const
     {
-        return {m_system.nvar,    m_system.neq, m_system.matrix, m_system.rhs,
-                m_system.weights, m_run.formed.problem.iobj,     sign};
+        return {m_system.nvar, m_system.neq,     m_system.matrix,
+                m_system.rhs,  m_system.weights, m_run.formed.problem.iobj,
+                sign};
     }
     const std::string& CaseName(int unknown) const
     {
@@ -133,8 +134,8 @@ void CExplainer::ExplainFailure(const std::function<bool(int, int)>& progress)
     if (m_out.contradicts) {
         for (const int row : conflict.rows) {
             const T_PLACE_OF_ROW place = PlaceOf(row);
-            m_out.conflict.push_back({place.constraint->name, place.limit, place.value,
-                                      UnitOf(*place.constraint)});
+            m_out.conflict.push_back(
+                {place.constraint->name, place.limit, place.value, UnitOf(*place.constraint)});
         }
         m_out.conflictWithSign = conflict.sign;
     }

@@ -25,8 +25,8 @@ struct T_ULF_RESULT {
 /// One calculation of an item: what went into the optimizer and what came out.
 struct T_ULF_RUN {
     T_ULFI_D item;
-    std::vector<T_ULF_CASE> cases;      // of the item's combination, in order
-    std::vector<T_ULFC_D> constraints;  // that take part, in the document's current units
+    std::vector<T_ULF_CASE> cases;     // of the item's combination, in order
+    std::vector<T_ULFC_D> constraints; // that take part, in the document's current units
     T_ULF_FORMED formed;
     T_OPT_ANSWER answer;
     std::vector<std::vector<double>> influence; // per constraint: response of every case
