@@ -10,15 +10,20 @@ void ReadHingeTables(CJsonReader& root, T_MODEL& model)
                       in.FailAt("factor", std::to_string(f.factor.size()) + " values, expected " +
                                               std::to_string(f.step.size()));
               });
-    ReadTable(root, "hinge_types", units, nullptr, model.hingeTypes,
-              [&](CJsonReader& in, const T_PHGT_D& t) {
-                  CheckReference(in, "section",
-                                 t.section == 0 || model.sections.contains(t.section), "section");
-                  CheckReference(in, "section_material",
-                                 t.sectionMaterial == 0 ||
-                                     model.materials.contains(t.sectionMaterial),
-                                 "material");
-              });
+    ReadTable(
+        root, "hinge_types", units, nullptr, model.hingeTypes,
+        [&](CJsonReader& in, const T_PHGT_D& t) {
+            const auto isSection = [&](const char* key, int section) {
+                CheckReference(in, key, section == 0 || model.sections.contains(section),
+                               "section");
+            };
+            isSection("section", t.section);
+            isSection("fibre_section", t.fibreSection);
+            isSection("thickness_section", t.thicknessSection);
+            CheckReference(in, "section_material",
+                           t.sectionMaterial == 0 || model.materials.contains(t.sectionMaterial),
+                           "material");
+        });
     ReadTable(
         root, "hinges", units, nullptr, model.hinges, [&](CJsonReader& in, const T_PHGE_D& h) {
             CheckReference(in, "element", model.elements.contains(h.element), "element");
