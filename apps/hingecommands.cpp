@@ -1,6 +1,7 @@
 #include "hingecommands.h"
 
 #include "inputfile.h"
+#include "output.h"
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/hingemirror.h"
@@ -16,7 +17,6 @@
 
 #ifdef QM_UI
 #include "qm_ui/hingeplot.h"
-#include "qm_ui/plotfile.h"
 #endif
 
 #include <algorithm>
@@ -25,12 +25,6 @@
 #include <tuple>
 
 namespace {
-
-EXIT_CODE Complain(EXIT_CODE code, const std::string& text)
-{
-    std::fprintf(stderr, "qm-rps: %s\n", text.c_str());
-    return code;
-}
 
 /// What the checks of a type read of its document.
 T_HINGE_CONTEXT ContextOf(CDBDoc& doc)
@@ -154,15 +148,6 @@ const char* SkeletonName(SKEL_TYPE type)
     return kNames[static_cast<std::size_t>(type)];
 }
 
-/// Writes the edited document: .qmdb a model file, else a case file.
-EXIT_CODE WriteDoc(CDBDoc& doc, const std::string& path)
-{
-    T_FILE_ERROR error;
-    const int written =
-        path.ends_with(".qmdb") ? doc.SaveModelAs(path, error) : doc.ExportCase(path, error);
-    return written ? EXIT_CODE::Done : ReportFileError(error);
-}
-
 /// Puts a changed type back as one undoable step.
 EXIT_CODE StoreType(CDBDoc& doc, int key, T_PHGT_D& type, const std::string& out)
 {
@@ -170,7 +155,7 @@ EXIT_CODE StoreType(CDBDoc& doc, int key, T_PHGT_D& type, const std::string& out
         component = MirroredComponent(component);
     if (!doc.Edit().Begin("hinge type") || !doc.Edit().Put(key, type) || !doc.Edit().Commit())
         return Complain(EXIT_CODE::BadInput, doc.Path() + ": the hinge type can't be stored");
-    return WriteDoc(doc, out);
+    return SaveDocument(doc, out);
 }
 
 /// Opens the document and takes the type of that name with its key.
@@ -470,8 +455,7 @@ EXIT_CODE RunHingePlot(const T_HINGE_OPTIONS& o)
         if (!curve) return Complain(EXIT_CODE::Usage, "choose a component, Fx to Mz");
         plot = HingeBackbonePlot(type, *component, *curve, EndName(page));
     }
-    std::string error;
-    if (!WritePlotFile(plot, o.out, error)) return Complain(EXIT_CODE::NoAccess, error);
+    if (const EXIT_CODE code = WritePicture(plot, o.out); code != EXIT_CODE::Done) return code;
     std::printf("%s written\n", o.out.c_str());
     return EXIT_CODE::Done;
 #else
