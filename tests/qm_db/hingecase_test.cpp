@@ -233,7 +233,7 @@ TEST(HingeCase, RefusesToStoreWhatCouldNotBeRead)
 }
 
 // The file was written by the program when it knew version 1 only, out of all_members.json.
-TEST(HingeCase, AFileOfVersion1OpensAndIsSavedAsVersion2)
+TEST(HingeCase, AFileOfVersion1OpensAndIsSavedAsTheCurrentVersion)
 {
     const CTempFolder folder;
     const std::string path = folder.File("model.qmdb");
@@ -252,8 +252,33 @@ TEST(HingeCase, AFileOfVersion1OpensAndIsSavedAsVersion2)
     content.model.pushovers.at(1).control = T_POLC_CONTROL{};
     content.model.styp.gsd = true;
     ASSERT_EQ(1, store.Save(path, content, error)) << error.text;
-    EXPECT_EQ(2, BytesOf(path)[63]);
+    EXPECT_EQ(3, BytesOf(path)[63]);
     ASSERT_EQ(1, CModelStore::CheckWhole(path, error)) << error.text;
+    ASSERT_EQ(1, CModelStore().Open(path, OPEN_MODE::ReadOnly, again, error)) << error.text;
+    EXPECT_TRUE(SameContent(content, again));
+}
+
+// Files written by the program when it knew version 2: the case file and its model file.
+TEST(HingeCase, FilesWithOlderKeysAndOfVersion2HoldTheSameModel)
+{
+    const T_MODEL_CONTENT now = ParseGood(RichText());
+    T_MODEL_CONTENT text, content, again;
+    T_FILE_ERROR error;
+    ASSERT_EQ(1, CCaseFile::Read(kData + "/cases/hinge_old_keys.json", text, error)) << error.text;
+    EXPECT_TRUE(SameContent(now, text));
+
+    const CTempFolder folder;
+    const std::string path = folder.File("model.qmdb");
+    WriteBytes(path, BytesOf(kData + "/model-v2.qmdb"));
+    ASSERT_EQ(2, BytesOf(path)[63]);
+    CModelStore store;
+    ASSERT_EQ(1, store.Open(path, OPEN_MODE::Edit, content, error)) << error.text;
+    EXPECT_TRUE(SameContent(now, content));
+    content.model.loadCases[1] = {"G", {0, 0, -1}, {}, {}, {}, {}, {}};
+    content.model.styp.plane = MODEL_PLANE::XZ;
+    content.model.elements.at(4).release.I[4] = true;
+    ASSERT_EQ(1, store.Save(path, content, error)) << error.text;
+    EXPECT_EQ(3, BytesOf(path)[63]);
     ASSERT_EQ(1, CModelStore().Open(path, OPEN_MODE::ReadOnly, again, error)) << error.text;
     EXPECT_TRUE(SameContent(content, again));
 }
