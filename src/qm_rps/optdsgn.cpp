@@ -146,8 +146,9 @@ int CheckRelaxed(int isign, T_OPT_ANSWER& answer)
 } // namespace
 
 COptDsgn::COptDsgn(IUlfResponse& staticSource, IUlfResponse* stageSource)
-    : m_static(staticSource), m_stage(stageSource),
-      m_solver(&CRps_UnknownLoadFactorManager::Calc_UnknownLoadFactor)
+    : m_static(staticSource), m_stage(stageSource), m_solver([](auto&&... arguments) {
+          return CRps_UnknownLoadFactorManager().Calc_UnknownLoadFactor(arguments...);
+      })
 {
 }
 
@@ -206,9 +207,8 @@ int COptDsgn::CallSolver(const T_OPT_PROBLEM& problem, T_OPT_ANSWER& answer)
 {
     const T_OPT_SYSTEM& s = answer.system;
     try {
-        return m_solver(answer.exact ? 0 : 1, s.ncon, s.nvar, s.neq, s.matrix.data(), s.rhs.data(),
-                        answer.factors.data(), s.weights.data(), problem.iobj, problem.isign,
-                        &answer.code);
+        return m_solver(answer.exact ? 0 : 1, s.ncon, s.nvar, s.neq, s.matrix, s.rhs,
+                        answer.factors, s.weights, problem.iobj, problem.isign, answer.code);
     } catch (const std::exception&) {
         return 0; // the solver gave up
     } catch (...) {

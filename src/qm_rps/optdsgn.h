@@ -56,9 +56,10 @@ public:
     /// The solver's interface, see CRps_UnknownLoadFactorManager::Calc_UnknownLoadFactor: mode (1
     /// optimise, 0 equations), NCON, NVAR, NEQ, matrix, right-hand sides, factors (written),
     /// weights, IOBJ, ISIGN, error code (written). Not 0: done.
-    using Solver = std::function<int(int mode, int ncon, int nvar, int neq, const double* matrix,
-                                     const double* rhs, double* factors, const double* weights,
-                                     int iobj, int isign, int* code)>;
+    using Solver =
+        std::function<int(int mode, int ncon, int nvar, int neq, std::span<const double> matrix,
+                          std::span<const double> rhs, std::span<double> factors,
+                          std::span<const double> weights, int iobj, int isign, int& code)>;
 
     /// Sources of responses; not owned, must outlive this object. A construction-stage problem
     /// needs the second one.

@@ -59,11 +59,9 @@ int CUlfStaticResponse::Read(std::span<const T_OPT_ITEM> items,
         for (std::size_t q = 0; ok && q < what.size(); ++q)
             ok = ReadOne(what[q], out[q * items.size() + i]) != 0;
         if (ok) continue;
-        T_STLD_D record;
-        const bool known = m_doc.Attr().GetStld(loadCase, record) != 0;
-        m_error =
-            MMSGFunction::Format("IDS_QM_ULF_CASE_NOT_READ",
-                                 {known ? record.name : std::to_string(loadCase), post.Error()});
+        m_error = post.Error();
+        if (m_error.empty())
+            m_error = MMSGFunction::Format("IDS_QM_ULF_CASE_NOT_READ", {std::to_string(loadCase)});
         return 0;
     }
     return 1;

@@ -32,16 +32,7 @@ int CUnknownLoadFactorConstraintDlg::Dlg2Data(T_ULFC_D& constraint)
 {
     if (!CheckData()) return 0;
     T_ULFC_D c = m_constraint;
-    if (c.inequality) {
-        c.compareWithValue = true;
-        c.value = 0.0;
-    } else {
-        c.upper.reset();
-        c.lower.reset();
-        if (!c.compareWithValue) c.value = 0.0;
-    }
-    if (c.compareWithValue) c.otherId = 0;
-    if (c.type != ULFC_TYPE::Beam) c.position = 0;
+    FitRecord(c);
     constraint = std::move(c);
     return 1;
 }

@@ -20,7 +20,7 @@ public:
 
     void Data2Dlg(const T_ULFC_D& constraint) { m_constraint = constraint; }
     /// Checks, then writes. 0: a message was shown, `constraint` as it was. What the chosen
-    /// relation does not use is dropped: bounds of an equality, target of an inequality.
+    /// kind does not use is dropped (FitRecord).
     [[nodiscard]] int Dlg2Data(T_ULFC_D& constraint);
 
     T_ULFC_D m_constraint; // as edited

@@ -39,11 +39,11 @@ struct T_HANDED {
 inline COptDsgn::Solver Answering(T_HANDED& handed, std::vector<double> factors, int code = 0,
                                   int result = 1)
 {
-    return [&handed, factors, code, result](int mode, int ncon, int nvar, int neq,
-                                            const double* matrix, const double* rhs, double* x,
-                                            const double* weights, int iobj, int isign, int* out) {
-        const auto list = [](const double* from, int count) {
-            return std::vector<double>(from, from + count);
+    return [&handed, factors, code, result](int mode, int ncon, int nvar, int neq, auto matrix,
+                                            auto rhs, std::span<double> x, auto weights, int iobj,
+                                            int isign, int& out) {
+        const auto list = [](std::span<const double> v) {
+            return std::vector<double>(v.begin(), v.end());
         };
         handed = {handed.calls + 1,
                   mode,
@@ -52,12 +52,12 @@ inline COptDsgn::Solver Answering(T_HANDED& handed, std::vector<double> factors,
                   neq,
                   iobj,
                   isign,
-                  list(matrix, ncon * nvar),
-                  list(rhs, ncon),
-                  list(weights, nvar),
+                  list(matrix),
+                  list(rhs),
+                  list(weights),
                   COptDsgn::IsSolverRunning()};
-        std::copy(factors.begin(), factors.end(), x);
-        *out = code;
+        std::copy(factors.begin(), factors.end(), x.begin());
+        out = code;
         return result;
     };
 }
