@@ -116,7 +116,8 @@ std::vector<T_MODE_RESULTS> ReadModes(CDBDoc& doc)
         T_MODE_RESULTS& m = out.emplace_back();
         T_MPAF_D factor;
         T_MPAM_D percent;
-        if (!doc.Post().SelectMode(mode) || !doc.Post().GetEiMpafNeutral(mode, factor) || !doc.Post().GetEiMpam(mode, percent))
+        if (!doc.Post().SelectMode(mode) || !doc.Post().GetEiMpafNeutral(mode, factor) ||
+            !doc.Post().GetEiMpam(mode, percent))
             continue;
         m.period = doc.Data().Model().modes.at(mode).period;
         m.participation = Tidy(factor.factor);

@@ -118,8 +118,12 @@ std::string BeamTable(const T_CASE_RESULTS& r, const T_UNITS& units)
 {
     std::vector<std::string> names;
     for (std::size_t i = 0; i < 6; ++i) // "moment y (kN*m)" is too wide for its column
-        names.push_back(std::string(i == 0 ? "N" : i == 1 ? "Vy" : i == 2 ? "Vz" : i == 3 ? "Mx"
-                                                      : i == 4 ? "My" : "Mz") +
+        names.push_back(std::string(i == 0   ? "N"
+                                    : i == 1 ? "Vy"
+                                    : i == 2 ? "Vz"
+                                    : i == 3 ? "Mx"
+                                    : i == 4 ? "My"
+                                             : "Mz") +
                         " (" + (i < 3 ? ForceName(units) : MomentName(units)) + ")");
     std::string text = "\nbeam forces, local axes (internal, of the cut seen from the I side)\n" +
                        Head("element at", names);
@@ -173,8 +177,8 @@ std::string AnalysisJson(const std::vector<T_SHOWN_CASE>& shown,
 std::string CaseTables(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& r, const T_UNITS& units)
 {
     const std::string force = ForceName(units), length = LengthName(units);
-    std::string text = "\n== " + shown.name + "\n\ndisplacements\n" +
-                       Head("node", Dofs("D", length, "R", "rad"));
+    std::string text =
+        "\n== " + shown.name + "\n\ndisplacements\n" + Head("node", Dofs("D", length, "R", "rad"));
     for (const auto& row : r.displacements)
         text += FormatText("%10d", row.id) + Columns(row.value) + "\n";
     text += "\nreactions (forces of the supports on the structure)\n" +
@@ -193,8 +197,8 @@ std::string CaseSummary(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& r, cons
 {
     const std::string force = ForceName(units), length = LengthName(units);
     const T_LARGEST d = Largest(r.displacements, Translation);
-    std::string text = shown.name + FormatText(": largest displacement %.6g %s", d.value,
-                                               length.c_str());
+    std::string text =
+        shown.name + FormatText(": largest displacement %.6g %s", d.value, length.c_str());
     if (d.id) text += FormatText(" at node %d", d.id);
     T_DOF6 sum{};
     for (const auto& row : r.reactions)
@@ -203,7 +207,8 @@ std::string CaseSummary(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& r, cons
     text += FormatText("; sum of reactions X %.6g, Y %.6g, Z %.6g %s", sum[0], sum[1], sum[2],
                        force.c_str());
     const T_LARGEST n = Largest(r.trusses, [](double v) { return v; });
-    if (n.id) text += FormatText("; largest truss force %.6g %s in %d", n.value, force.c_str(), n.id);
+    if (n.id)
+        text += FormatText("; largest truss force %.6g %s in %d", n.value, force.c_str(), n.id);
     const auto bending = [](const T_BEAM_ROWS& rows) {
         double largest = 0.0;
         for (const T_DOF6& row : rows)
@@ -219,9 +224,9 @@ std::string CaseSummary(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& r, cons
 
 std::string ModeTable(const std::vector<T_MODE_RESULTS>& modes)
 {
-    std::string text = "\nmodes: period, and effective mass in per cent of each direction's total\n" +
-                       Head("mode", {"T (s)", "X (%)", "Y (%)", "Z (%)", "RX (%)", "RY (%)",
-                                     "RZ (%)"});
+    std::string text =
+        "\nmodes: period, and effective mass in per cent of each direction's total\n" +
+        Head("mode", {"T (s)", "X (%)", "Y (%)", "Z (%)", "RX (%)", "RY (%)", "RZ (%)"});
     T_DOF6 sum{};
     for (std::size_t i = 0; i < modes.size(); ++i) {
         text += FormatText("%10zu", i + 1) + Column(modes[i].period) +

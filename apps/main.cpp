@@ -122,6 +122,8 @@ int main(int argc, char** argv)
     AddVerify(app, code);
     AddHingeCommands(app, code);
     AddCase(app, code);
+    AddAnalyse(app, code);
+    AddUlf(app, code);
     try {
         app.parse(argc, argv);
     } catch (const CLI::ParseError& e) {
