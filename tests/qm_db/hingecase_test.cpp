@@ -161,7 +161,7 @@ TEST(HingeCase, BadInputNamesThePlace)
         {"\"sections\"", "0.3, 0.5]", "0.3, 0.5, 1]", "sections[0].size: 5 values, expected up to 4"},
         {"\"elements\"", "\"id\": 7", "\"id\": 4", "elements[1].id: element 4 appears twice"},
         {"\"elements\"", "[2, 3]", "[2, 5]", "elements[1].nodes[1]: there is no such node"},
-        {"\"elements\"", "\"section\": 2", "\"section\": 12", "elements[1].section: there is no such section"},
+        {"\"elements\"", "\"section\": \"R\"", "\"section\": \"Q\"", "elements[1].section: there is no such section"},
         {"hinge_types", "\"section\": 2", "\"section\": 9", "hinge_types[0].section: there is no such section"},
         {"hinge_types", "\"degrading slip\"", "\"slip\"", "hinge_types[0].components.My.I.unload_type: unknown unloading type \"slip\"; allowed: origin, nonlinear elastic, bilinear, stiffness degrading, degrading slip"},
         {"hinge_types", "\"type\": \"FEMA\",", "", "hinge_types[0].components.My: \"type\" is missing"},
