@@ -191,14 +191,13 @@ int COptDsgn::Run(const T_OPT_PROBLEM& problem, T_OPT_ANSWER& answer)
     answer = {};
     answer.factors.assign(static_cast<std::size_t>(std::max(0, problem.nvar)), 0.0);
     std::vector<T_OPT_ROW> rows;
-    if (!CheckProblem(problem, answer) || !ReadRows(problem, rows, answer) ||
-        !PreCheck(rows, problem, answer))
-        return 0;
-    T_OPT_SYSTEM system = SystemOf(rows, problem);
+    if (!CheckProblem(problem, answer) || !ReadRows(problem, rows, answer)) return 0;
+    answer.system = SystemOf(rows, problem);
+    const T_OPT_SYSTEM& system = answer.system;
+    if (!PreCheck(rows, problem, answer)) return 0;
     answer.exact = system.neq == system.nvar && system.ncon == system.nvar;
     if (!answer.exact && problem.solveByEquations)
         return Fail(answer, "IDS_RPS_NOT_SOLVED_SIMUL_EQ_METHOD");
-    answer.system = std::move(system);
     if (m_dump.enabled) WriteOptDump(m_dump, answer, problem.iobj, problem.isign);
     return answer.exact ? SolveExact(problem, answer) : SolveOptimum(problem, answer);
 }

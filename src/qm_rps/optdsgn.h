@@ -36,7 +36,7 @@ struct T_OPT_ANSWER {
     /// Construction stage only, per constraint: what the known items contribute.
     std::vector<double> constants;
     bool exact = false;  // solved as equations
-    T_OPT_SYSTEM system; // as handed to the solver; empty when it was not called
+    T_OPT_SYSTEM system; // as handed to the solver; empty when the rows could not be read
     int code = 0;        // of the solver; 10: it failed
     std::string key;     // of the failure
     std::string message; // the failure in words; empty when factors were found

@@ -28,6 +28,23 @@ T_ULF_RESULT_CONSTRAINT UlfResultConstraint(const T_ULFC_D& c)
     return out;
 }
 
+T_ULF_RESULT UlfResultOf(const T_ULF_RUN& run, std::span<const double> factors)
+{
+    T_ULF_RESULT r;
+    r.item = run.item;
+    r.cases = run.cases;
+    for (const T_ULF_CASE& c : run.cases)
+        r.factors.push_back(c.factor);
+    for (std::size_t i = 0; i < run.formed.unknowns.size(); ++i)
+        r.factors[run.formed.unknowns[i]] = factors[i];
+    for (const T_ULFC_D& c : run.constraints)
+        r.constraints.push_back(UlfResultConstraint(c));
+    r.influence = run.influence;
+    r.exact = run.answer.exact;
+    r.code = run.answer.code;
+    return r;
+}
+
 double UlfValue(const T_ULF_RESULT& r, std::size_t constraint)
 {
     double sum = 0.0;

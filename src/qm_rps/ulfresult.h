@@ -22,6 +22,20 @@ struct T_ULF_RESULT {
     int code = 0;                                     // of the solver
 };
 
+/// One calculation of an item: what went into the optimizer and what came out.
+struct T_ULF_RUN {
+    T_ULFI_D item;
+    std::vector<T_ULF_CASE> cases;     // of the item's combination, in order
+    std::vector<T_ULFC_D> constraints; // that take part, in the document's current units
+    T_ULF_FORMED formed;
+    T_OPT_ANSWER answer;
+    std::vector<std::vector<double>> influence; // per constraint: response of every case
+};
+
+/// The result set of a run with these factors, one per unknown: the solved ones, or others to be
+/// shown in the same way.
+T_ULF_RESULT UlfResultOf(const T_ULF_RUN& run, std::span<const double> factors);
+
 /// A row of the result table.
 struct T_ULF_RESULT_ROW {
     std::string name;

@@ -79,3 +79,11 @@ std::string UlfDescription(const T_ULFC_D& c)
         return MMSGFunction::Format("IDS_RPS__s_of_Node__d__s", {component, id, relation});
     }
 }
+
+std::string UlfUnitText(ULFC_TYPE type, int component, const T_UNITS& units)
+{
+    const std::string length(NameOf(units.length)), force(NameOf(units.force));
+    const bool angular = component >= 3;
+    if (type == ULFC_TYPE::Displacement) return angular ? "rad" : length;
+    return angular ? force + "*" + length : force;
+}

@@ -2,6 +2,7 @@
 #pragma once
 
 #include "qm_db/loadrecords.h"
+#include "qm_db/units.h"
 
 #include <string>
 
@@ -14,3 +15,5 @@ std::string UlfPositionText(int position);
 std::string UlfRelationText(const T_ULFC_D& constraint);
 /// The quantity and its relation: "DZ of node 5 <=      0.0100". Values in the record's units.
 std::string UlfDescription(const T_ULFC_D& constraint);
+/// Unit of the quantity: "m", "rad", "kN", "kN*m".
+std::string UlfUnitText(ULFC_TYPE type, int component, const T_UNITS& units);

@@ -171,16 +171,16 @@ int CUnknownLoadFactorItemDlg::OnOK()
     return 1;
 }
 
-int CUnknownLoadFactorItemDlg::ReadRun(T_RUN& run) const
+int CUnknownLoadFactorItemDlg::ReadRun(T_ULF_RUN& run) const
 {
-    const T_ULFI_D item = Record();
+    run.item = Record();
     run.cases = m_cases;
-    for (const std::string& name : item.constraints) {
+    for (const std::string& name : run.item.constraints) {
         T_ULFC_D constraint;
         if (!m_doc.Attr().GetUlfc_(name, constraint)) return 0;
         run.constraints.push_back(std::move(constraint));
     }
-    run.formed = FormUlfProblem(item, run.cases, run.constraints);
+    run.formed = FormUlfProblem(run.item, run.cases, run.constraints);
     return 1;
 }
 
@@ -188,15 +188,16 @@ int CUnknownLoadFactorItemDlg::OnCalculate()
 {
     m_result.reset();
     m_run.reset();
-    T_RUN run;
+    T_ULF_RUN run;
     if (!CheckData() || !ReadRun(run)) return 0;
 
     COptDsgn optimizer(m_cache);
     optimizer.m_dump = {m_dump, m_doc.Path(),
                         [this] { return AskYesNo("IDS_QM_ULF_DUMP_EXISTS"); }};
-    std::vector<std::vector<double>> influence;
-    const bool solved = optimizer.Run(run.formed.problem, run.answer) &&
-                        ReadUlfInfluence(run.cases, run.constraints, m_cache, influence);
+    // The matrix of all cases comes from the cache, also when there is no solution to explain.
+    const bool found = optimizer.Run(run.formed.problem, run.answer) != 0;
+    const bool solved =
+        ReadUlfInfluence(run.cases, run.constraints, m_cache, run.influence) && found;
     m_run = run;
     if (!solved) {
         constexpr const char* key = "IDS_RPS_Unknown_Load_Factor_Item_has_an_error";
@@ -204,14 +205,14 @@ int CUnknownLoadFactorItemDlg::OnCalculate()
         WriteHistory("IDS_RPS_Unknown_CANNOT_FIND_OPTIMIZED_SOLUTION");
         return 0;
     }
-    KeepResult(run, std::move(influence));
+    m_result = UlfResultOf(run, run.answer.factors);
     WriteHistory("IDS_RPS_Unknown_CAN_FIND_OPTIMIZED_SOLUTION");
     ReportMisses();
     return 1;
 }
 
 /// The optimizer's message with the name of the constraint or load case that it numbers.
-std::string CUnknownLoadFactorItemDlg::FailureText(const T_RUN& run) const
+std::string CUnknownLoadFactorItemDlg::FailureText(const T_ULF_RUN& run) const
 {
     const T_OPT_ANSWER& a = run.answer;
     if (a.message.empty()) return m_cache.Error();
@@ -221,24 +222,6 @@ std::string CUnknownLoadFactorItemDlg::FailureText(const T_RUN& run) const
     else if (a.factor > 0)
         name = run.cases[run.formed.unknowns[static_cast<std::size_t>(a.factor - 1)]].name;
     return name.empty() ? a.message : a.message + " (" + name + ")";
-}
-
-void CUnknownLoadFactorItemDlg::KeepResult(const T_RUN& run,
-                                           std::vector<std::vector<double>> influence)
-{
-    T_ULF_RESULT r;
-    r.item = Record();
-    r.cases = run.cases;
-    for (const T_ULF_CASE& c : run.cases)
-        r.factors.push_back(c.factor);
-    for (std::size_t i = 0; i < run.formed.unknowns.size(); ++i)
-        r.factors[run.formed.unknowns[i]] = run.answer.factors[i];
-    for (const T_ULFC_D& c : run.constraints)
-        r.constraints.push_back(UlfResultConstraint(c));
-    r.influence = std::move(influence);
-    r.exact = run.answer.exact;
-    r.code = run.answer.code;
-    m_result = std::move(r);
 }
 
 void CUnknownLoadFactorItemDlg::ReportMisses()

@@ -28,14 +28,6 @@ public:
         bool operator==(const T_CHECK&) const = default;
     };
 
-    /// What the last calculation handed to the optimizer and got back.
-    struct T_RUN {
-        T_ULF_FORMED formed;
-        T_OPT_ANSWER answer;
-        std::vector<T_ULF_CASE> cases;
-        std::vector<T_ULFC_D> constraints;
-    };
-
     /// The document must outlive the dialog. key: of the item to edit, 0 for a new one, which
     /// starts with the model's first combination.
     explicit CUnknownLoadFactorItemDlg(CDBDoc& doc, int key = 0);
@@ -76,15 +68,14 @@ public:
     [[nodiscard]] int OnCalculate();
     const std::optional<T_ULF_RESULT>& Result() const { return m_result; }
     /// Of the latest calculation that reached the optimizer, for its explanation.
-    const std::optional<T_RUN>& LastRun() const { return m_run; }
+    const std::optional<T_ULF_RUN>& LastRun() const { return m_run; }
 
     bool m_dump = false; // debug: write the problem handed to the solver beside the model file
 
 private:
     std::optional<T_LCOM_D> Normalised(int combination) const;
-    int ReadRun(T_RUN& run) const;
-    std::string FailureText(const T_RUN& run) const;
-    void KeepResult(const T_RUN& run, std::vector<std::vector<double>> influence);
+    int ReadRun(T_ULF_RUN& run) const;
+    std::string FailureText(const T_ULF_RUN& run) const;
     void ReportMisses();
 
     CDBDoc& m_doc;
@@ -95,6 +86,6 @@ private:
     std::vector<std::string> m_missing;      // constraints that the item names and the model lacks
     CUlfStaticResponse m_source;
     CUlfInfluenceCache m_cache;
-    std::optional<T_RUN> m_run;
+    std::optional<T_ULF_RUN> m_run;
     std::optional<T_ULF_RESULT> m_result;
 };

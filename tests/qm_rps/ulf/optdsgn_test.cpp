@@ -35,6 +35,16 @@ std::string TextOf(const char* key, int number)
     return zql::lib::MMSGFunction::Format(key, {std::to_string(number)});
 }
 
+struct T_ROW_CASE {
+    const char* label;
+    T_OPT_RECORD record;
+    T_OPT_QUANTITY first, second;
+    std::vector<double> row; // by hand
+    double rhs;
+    int relation;
+    std::vector<double> coefficients; // of every item
+};
+
 struct OptDsgn : testing::Test {
     ~OptDsgn() override { CTestEnvMgr::ClearST(); }
 
@@ -77,37 +87,37 @@ TEST(OptRows, FollowTheRuleForEveryKind)
 {
     // Cases 1 and 3 unknown, case 2 known with 0.5. Places 5 and 6: 4 6 -2 and 1 8 3.
     const std::vector<T_OPT_ITEM> items{Unknown(1), Known(2, 0.5), Unknown(3)};
-    const struct {
-        const char* label;
-        T_OPT_RECORD record;
-        T_OPT_QUANTITY first, second;
-        T_OPT_ROW row;                    // by hand
-        std::vector<double> coefficients; // of every item
-    } kCases[] = {
-        {"displacement", {1, 5, 3, 10, 0, 1, 6}, {1, 5, 0, 3}, {}, {{4, -2}, 7, 0}, {4, 6, -2}},
-        {"reaction", {2, 5, 1, 10, -1, 1, 0}, {2, 5, 0, 1}, {}, {{4, -2}, 7, -1}, {4, 6, -2}},
-        {"truss", {3, 5, 1, -1, 1, 1, 0}, {3, 5, 0, 1}, {}, {{4, -2}, -4, 1}, {4, 6, -2}},
-        {"beam", {4, 5, 2, 6, 10, 1, 1, 6}, {4, 5, 2, 6}, {}, {{4, -2}, 7, 1}, {4, 6, -2}},
+    static const T_ROW_CASE kCases[] = {
+        {"displacement", {1, 5, 3, 10, 0, 1, 6}, {1, 5, 0, 3}, {}, {4, -2}, 7, 0, {4, 6, -2}},
+        {"reaction", {2, 5, 1, 10, -1, 1, 0}, {2, 5, 0, 1}, {}, {4, -2}, 7, -1, {4, 6, -2}},
+        {"truss", {3, 5, 1, -1, 1, 1, 0}, {3, 5, 0, 1}, {}, {4, -2}, -4, 1, {4, 6, -2}},
+        {"beam", {4, 5, 2, 6, 10, 1, 1, 6}, {4, 5, 2, 6}, {}, {4, -2}, 7, 1, {4, 6, -2}},
         {"compared",
          {1, 5, 3, 10, 0, 0, 6},
          {1, 5, 0, 3},
          {1, 6, 0, 3},
-         {{3, -5}, 1, 0},
+         {3, -5},
+         1,
+         0,
          {3, -2, -5}},
         {"compared beam",
          {4, 5, 4, 2, 10, 0, 0, 6},
          {4, 5, 4, 2},
          {4, 6, 4, 2},
-         {{3, -5}, 1, 0},
+         {3, -5},
+         1,
+         0,
          {3, -2, -5}},
         {"entries truncated",
          {1.9, 5.9, 3.9, 10, -0.9, 1.9},
          {1, 5, 0, 3},
          {},
-         {{4, -2}, 7, 0},
+         {4, -2},
+         7,
+         0,
          {4, 6, -2}},
-        {"unknown kind", {7, 5, 3, 10, 1, 1, 6}, {}, {}, {{0, 0}, 0, 0}, {0, 0, 0}},
-        {"kind below 1", {0.5, 5, 3, 10, -1, 1, 6}, {}, {}, {{0, 0}, 0, 0}, {0, 0, 0}},
+        {"unknown kind", {7, 5, 3, 10, 1, 1, 6}, {}, {}, {0, 0}, 0, 0, {0, 0, 0}},
+        {"kind below 1", {0.5, 5, 3, 10, -1, 1, 6}, {}, {}, {0, 0}, 0, 0, {0, 0, 0}},
     };
     for (const auto& c : kCases) {
         CTableResponse source;
@@ -118,7 +128,7 @@ TEST(OptRows, FollowTheRuleForEveryKind)
         std::vector<std::vector<double>> coefficients;
         ASSERT_EQ(1, BuildRows(items, std::span(&c.record, 1), source, rows, coefficients))
             << c.label;
-        EXPECT_EQ(c.row, rows[0]) << c.label;
+        EXPECT_EQ((T_OPT_ROW{c.row, c.rhs, c.relation}), rows[0]) << c.label;
         EXPECT_EQ(c.coefficients, coefficients[0]) << c.label;
     }
 }
@@ -200,7 +210,9 @@ TEST_F(OptDsgn, ChoosesEquationsForASquareSystemOfEqualitiesOnly)
                   Run(Problem(c.rows, 0, c.byEquations), Answering(m_handed, {1, 1})) == 1)
             << c.label;
         EXPECT_EQ(c.mode, m_handed.mode) << c.label;
-        if (c.mode < 0) EXPECT_EQ(kNotSquare, m_answer.key) << c.label;
+        if (c.mode < 0) {
+            EXPECT_EQ(kNotSquare, m_answer.key) << c.label;
+        }
     }
 }
 
@@ -241,7 +253,9 @@ TEST_F(OptDsgn, PreChecksTheDiagonalBeforeEquations)
         (void)Run(Problem({{{c.c}, c.relation, c.rhs}}, c.isign, true), Answering(m_handed, {0}));
         EXPECT_EQ(c.key, m_answer.key) << c.label;
         const bool precheck = c.key == std::string(kPositive) || c.key == std::string(kNegative);
-        if (precheck) EXPECT_EQ(TextOf(c.key, 1), m_answer.message) << c.label;
+        if (precheck) {
+            EXPECT_EQ(TextOf(c.key, 1), m_answer.message) << c.label;
+        }
     }
 }
 
@@ -334,7 +348,9 @@ TEST_F(OptDsgn, JudgesCode9ByTheSolution)
         const int result = Run(Problem(rows, c.isign, false), Answering(m_handed, c.x, 9));
         EXPECT_EQ(c.key, m_answer.key) << c.label;
         EXPECT_EQ(m_answer.key.empty() ? 1 : 0, result) << c.label;
-        if (c.number) EXPECT_EQ(TextOf(c.key, c.number), m_answer.message) << c.label;
+        if (c.number) {
+            EXPECT_EQ(TextOf(c.key, c.number), m_answer.message) << c.label;
+        }
     }
     (void)Run(Problem(rows, 1, false), Answering(m_handed, {0, 1.5}, 9));
     EXPECT_EQ(2, m_answer.constraint); // by its place in the problem, not among the rows handed
@@ -360,7 +376,9 @@ TEST_F(OptDsgn, ExactModeIgnoresTheReturnAndChecksSigns)
         EXPECT_EQ(0, m_handed.running);
         EXPECT_EQ(c.key, m_answer.key);
         EXPECT_EQ(m_answer.key.empty() ? 1 : 0, result);
-        if (c.number) EXPECT_EQ(TextOf(c.key, c.number), m_answer.message);
+        if (c.number) {
+            EXPECT_EQ(TextOf(c.key, c.number), m_answer.message);
+        }
     }
 }
 

@@ -153,7 +153,7 @@ TEST(UlfSheet, RefusesMoreConstraintsThanColumns)
             << c.version << " " << c.constraints;
     T_SHEET s;
     s.name = "before";
-    EXPECT_EQ(0, MakeUlfSheet(Result(1, 231), {11}, s));
+    EXPECT_EQ(0, MakeUlfSheet(Result(1, 231), {11, 0, 0, 0, {}}, s));
     EXPECT_EQ("before", s.name);
     EXPECT_TRUE(s.cells.empty());
 }
@@ -189,6 +189,8 @@ TEST(UlfCombination, ReplacesInOneAndMultipliesInSeveral)
             EXPECT_EQ(c.split ? "frame-" + std::to_string(i + 1) : "frame", p.parts[i].name);
         }
         EXPECT_EQ((T_LCOM_ITEM{false, 2, c.second}), p.parts[0].items[1]) << c.entries;
-        if (c.entries == 1000) EXPECT_EQ((T_LCOM_ITEM{false, 1000, 2000.0}), p.parts[1].items[0]);
+        if (c.entries == 1000) {
+            EXPECT_EQ((T_LCOM_ITEM{false, 1000, 2000.0}), p.parts[1].items[0]);
+        }
     }
 }
