@@ -204,6 +204,12 @@ std::string CaseSummary(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& r, cons
     for (const auto& row : r.reactions)
         for (std::size_t i = 0; i < sum.size(); ++i)
             sum[i] += row.value[i];
+    double size = 0.0; // reactions that cancel leave rounding
+    for (const auto& row : r.reactions)
+        size = std::max(
+            {size, std::fabs(row.value[0]), std::fabs(row.value[1]), std::fabs(row.value[2])});
+    for (double& s : sum)
+        if (std::fabs(s) <= 1e-10 * size) s = 0.0;
     text += FormatText("; sum of reactions X %.6g, Y %.6g, Z %.6g %s", sum[0], sum[1], sum[2],
                        force.c_str());
     const T_LARGEST n = Largest(r.trusses, [](double v) { return v; });

@@ -40,14 +40,18 @@ void AddSolve(CLI::App* ulf, const OPTIONS& o, EXIT_CODE& code)
 
 void AddUlf(CLI::App& app, EXIT_CODE& code)
 {
-    auto* ulf = app.add_subcommand("ulf", "Unknown load factors: list, check, solve, export, "
-                                          "combine");
+    auto* ulf = app.add_subcommand("ulf", "Unknown load factors: list, check, solve, explain, "
+                                          "export, combine");
     ulf->require_subcommand(1);
     ulf->footer("Example:\n  qm-rps ulf solve examples/cable-stayed-bridge/case.json --item LEVEL");
     const OPTIONS o = std::make_shared<T_ULF_OPTIONS>();
     AddOne(ulf, "list", "List items and constraints", "", o, RunUlfList, code);
     AddItem(AddOne(ulf, "check", "Check every rule", "", o, RunUlfCheck, code), o, false);
     AddSolve(ulf, o, code);
+    auto* explain = AddOne(ulf, "explain", "Say what holds the factors, or what contradicts",
+                           " --item \"NO UPLIFT\"", o, RunUlfExplain, code);
+    AddItem(explain, o, true);
+    explain->add_option("--json", o->json, "Write it as JSON; - for standard output");
     auto* sheet = AddOne(ulf, "export", "Write the spreadsheet with the influence matrix",
                          " --item LEVEL -o level.xlsx", o, RunUlfExport, code);
     AddItem(sheet, o, true);

@@ -18,6 +18,7 @@
 #include <ctime>
 #include <filesystem>
 #include <memory>
+#include <unistd.h>
 
 namespace {
 
@@ -71,7 +72,7 @@ T_ULF_PICTURE PictureOf(CDBDoc& doc, const T_ULF_RESULT& r)
                        doc.Data().Model().styp.title;
     for (const T_ULF_RESULT_ROW& row : UlfResultRows(r))
         picture.bars.push_back({row.name, UlfUnit(doc, row.name), row.value, row.upper, row.lower,
-                                row.active, !row.met});
+                                row.active, !row.met, UlfScale(r, picture.bars.size())});
     for (std::size_t i = 0; i < r.cases.size(); ++i)
         picture.notes.push_back(FactorNote(r.cases[i], r.factors[i]));
     return picture;
@@ -110,6 +111,15 @@ EXIT_CODE DrawPictures(CDBDoc& doc, const T_ULF_RESULT& r, const T_ULF_OPTIONS& 
     (void)doc, (void)r, (void)o;
     return EXIT_CODE::Done;
 #endif
+}
+
+/// Shows how far a long search is, where somebody looks at it.
+bool ShowSearch(int tried, int members)
+{
+    std::fprintf(stderr, "\rqm-rps: looking for the contradiction, %d of %d%s", tried, members,
+                 tried == members ? "\n" : "");
+    std::fflush(stderr);
+    return true;
 }
 
 /// Today, or YYYY-MM-DD. False: the text is no date.
@@ -202,6 +212,26 @@ EXIT_CODE RunUlfSolve(const T_ULF_OPTIONS& o)
     if (o.json != "-") std::printf("%s", UlfTables(*result).c_str());
     const EXIT_CODE drawn = DrawPictures(in.doc, *result, o);
     return drawn == EXIT_CODE::Done ? outcome.code : drawn;
+}
+
+EXIT_CODE RunUlfExplain(const T_ULF_OPTIONS& o)
+{
+    T_OPENED in;
+    if (const EXIT_CODE code = OpenItem(o, in); code != EXIT_CODE::Done) return code;
+    const T_ULF_OUTCOME outcome = SolveUlf(*in.dialog);
+    T_ULF_EXPLAINED explained;
+    const auto& run = in.dialog->LastRun();
+    const std::function<bool(int, int)> progress =
+        isatty(STDERR_FILENO) ? ShowSearch : std::function<bool(int, int)>();
+    if (!run || !ExplainUlf(*run, in.doc.Unit().Units(), explained, progress))
+        return Complain(outcome.code, o.file + ": " + outcome.message);
+    if (!o.json.empty()) {
+        const EXIT_CODE code = WriteOutput(o.json, ExplainJson(explained));
+        if (code != EXIT_CODE::Done) return code;
+    }
+    for (const std::string& line : explained.lines)
+        if (o.json != "-") std::printf("%s\n", line.c_str());
+    return outcome.code;
 }
 
 EXIT_CODE RunUlfExport(const T_ULF_OPTIONS& o)

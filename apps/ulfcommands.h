@@ -24,6 +24,9 @@ EXIT_CODE RunUlfCheck(const T_ULF_OPTIONS& options);
 /// Finds the factors. A case file is analysed in memory; a model file must hold results.
 /// NotFound: there is no solution, or a constraint is not met.
 EXIT_CODE RunUlfSolve(const T_ULF_OPTIONS& options);
+/// What holds the solution and what relaxing it buys; or which constraints contradict each other,
+/// and the compromise that misses them least. NotFound: there is no solution.
+EXIT_CODE RunUlfExplain(const T_ULF_OPTIONS& options);
 /// Solves and writes the spreadsheet with the influence matrix.
 EXIT_CODE RunUlfExport(const T_ULF_OPTIONS& options);
 /// Solves and adds the load combination with the factors.

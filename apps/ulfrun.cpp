@@ -6,6 +6,8 @@
 #include "qm_rps/ulfchecks.h"
 
 #include <algorithm>
+#include <array>
+#include <cmath>
 
 using zql::lib::MMSGFunction;
 
@@ -55,6 +57,23 @@ std::string ConstraintsJson(const T_ULF_RESULT& r)
     return text + "\n ]";
 }
 
+/// [ ... ], one to a line.
+template <class T, class F>
+std::string List(const std::vector<T>& items, const F& print)
+{
+    std::string text = "[";
+    for (const T& item : items)
+        text += (text.size() > 1 ? ",\n  " : "\n  ") + print(item);
+    return text + (items.empty() ? "]" : "\n ]");
+}
+
+/// For tables: what rounding has left of a zero is shown as 0.
+double Shown(double value, double scale)
+{
+    constexpr double kZero = 1e-12; // of the row's scale
+    return std::fabs(value) <= kZero * scale ? 0.0 : value + 0.0;
+}
+
 template <class ROWS, class F>
 int Widest(const ROWS& rows, int least, const F& text)
 {
@@ -101,6 +120,35 @@ std::string UlfJson(const T_ULF_OUTCOME& o, const std::optional<T_ULF_RESULT>& r
            ",\n \"objective\": " + (r ? ShortestText(UlfObjective(*r)) : "null") + "\n}\n";
 }
 
+std::string ExplainJson(const T_ULF_EXPLAINED& e)
+{
+    const auto limit = [](const auto& h) {
+        static constexpr std::array<const char*, 4> kNames{"target", "upper", "lower", "sign"};
+        return "{\"name\": " + JsonText(h.name) + ", \"limit\": \"" +
+               kNames[static_cast<std::size_t>(h.limit)] +
+               "\", \"value\": " + ShortestText(h.value + 0.0) + ", \"unit\": " + JsonText(h.unit);
+    };
+    const std::string tail = ",\n \"compromise\": ";
+    std::string text =
+        FormatText("{\n \"solved\": %s,\n \"unknowns\": %d,\n \"rows\": %d,\n \"rank\": %d,\n ",
+                   e.solved ? "true" : "false", e.unknowns, e.rows, e.rank) +
+        "\"condition\": " + ShortestText(e.condition) +
+        ",\n \"unfelt\": " + List(e.unfelt, JsonText) +
+        ",\n \"objective\": " + (e.solved ? ShortestText(e.objective + 0.0) : "null") +
+        ",\n \"held\": " +
+        List(e.held,
+             [&](const T_ULF_HOLD& h) {
+                 return limit(h) + ", \"multiplier\": " + ShortestText(h.multiplier + 0.0) + "}";
+             }) +
+        ",\n \"conflict\": " +
+        List(e.conflict, [&](const T_ULF_CLASH& c) { return limit(c) + "}"; }) +
+        ",\n \"conflict_with_sign\": " + (e.conflictWithSign ? "true" : "false") + tail;
+    text += e.compromise ? "{\n \"factors\": " + FactorsJson(*e.compromise) +
+                               ",\n \"constraints\": " + ConstraintsJson(*e.compromise) + "\n }"
+                         : "null";
+    return text + ",\n \"lines\": " + List(e.lines, JsonText) + "\n}\n";
+}
+
 std::string UlfTables(const T_ULF_RESULT& r)
 {
     const int caseWidth = Widest(r.cases, 10, [](const T_ULF_CASE& c) { return c.name; });
@@ -112,13 +160,14 @@ std::string UlfTables(const T_ULF_RESULT& r)
     const int width = Widest(rows, 10, [](const T_ULF_RESULT_ROW& row) { return row.name; });
     text += FormatText("\n%-*s %15s %15s %15s %13s  %s\n", width, "constraint", "value", "lower",
                        "upper", "missed by", "state");
-    for (const T_ULF_RESULT_ROW& row : rows)
+    for (std::size_t i = 0; i < rows.size(); ++i) {
+        const T_ULF_RESULT_ROW& row = rows[i];
+        const double scale = UlfScale(r, i);
+        const char* const state = !row.met ? "not met" : row.active ? "active" : "-";
         text += FormatText("%-*s %15.7g %15s %15s %13.3g  %s\n", width, row.name.c_str(),
-                           row.value + 0.0, Short(row.lower).c_str(), Short(row.upper).c_str(),
-                           row.residual + 0.0,
-                           !row.met     ? "not met"
-                           : row.active ? "active"
-                                        : "-");
+                           Shown(row.value, scale), Short(row.lower).c_str(),
+                           Short(row.upper).c_str(), Shown(row.residual, scale), state);
+    }
     return text + FormatText("\nobjective %.9g\n", UlfObjective(r));
 }
 

@@ -2,6 +2,7 @@
 #pragma once
 
 #include "exitcodes.h"
+#include "qm_rps/ulfexplain.h"
 #include "qm_rps/unknownloadfactoritemdlg.h"
 
 #include <string>
@@ -20,6 +21,8 @@ T_ULF_OUTCOME SolveUlf(CUnknownLoadFactorItemDlg& dialog);
 
 /// {"status", "code", "message", "mode", "factors", "constraints", "objective"}.
 std::string UlfJson(const T_ULF_OUTCOME& outcome, const std::optional<T_ULF_RESULT>& result);
+/// What holds the solution, or what contradicts, with the words of ExplainUlf in "lines".
+std::string ExplainJson(const T_ULF_EXPLAINED& explained);
 /// Tables of the factors and of the constraints.
 std::string UlfTables(const T_ULF_RESULT& result);
 /// Unit of a constraint's value; empty for a rotation.

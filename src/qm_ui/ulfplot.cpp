@@ -40,11 +40,16 @@ KIND KindOf(const T_ULF_BAR& b)
     return b.active ? kActive : kWithin;
 }
 
-/// Distance from the bound in parts of it.
-double FromBound(double value, double bound)
+/// The row's own unit for distances.
+double SizeOf(const T_ULF_BAR& b, double bound)
 {
-    const double size = bound != 0.0 ? std::fabs(bound) : std::max(std::fabs(value), 1e-300);
-    return (value - bound) / size;
+    return std::max(
+        {bound != 0.0 ? std::fabs(bound) : std::max(b.scale, std::fabs(b.value)), 1e-300});
+}
+
+double FromBound(const T_ULF_BAR& b, double bound)
+{
+    return (b.value - bound) / SizeOf(b, bound);
 }
 
 std::string BoundText(const T_ULF_BAR& b)
@@ -57,7 +62,9 @@ std::string BoundText(const T_ULF_BAR& b)
 
 std::string ValueText(const T_ULF_BAR& b)
 {
-    return FormatText("%.5g", b.value) + (b.unit.empty() ? "" : " " + b.unit) + BoundText(b);
+    constexpr double kZero = 1e-10; // of the scale: what rounding leaves
+    const double value = std::fabs(b.value) <= kZero * b.scale ? 0.0 : b.value;
+    return FormatText("%.5g", value) + (b.unit.empty() ? "" : " " + b.unit) + BoundText(b);
 }
 
 void AddSegment(T_PLOT_SERIES& s, double x1, double y1, double x2, double y2)
@@ -131,12 +138,12 @@ void MakeRoom(T_PLOT& plot, double rows)
 double UlfPosition(const T_ULF_BAR& b)
 {
     if (IsEquality(b)) {
-        const double size = std::max(std::fabs(*b.upper), std::fabs(b.value));
+        const double size = std::max({std::fabs(*b.upper), std::fabs(b.value), b.scale});
         return size > 0.0 ? (b.value - *b.upper) / size : 0.0;
     }
     if (b.upper && b.lower) return (2.0 * b.value - *b.upper - *b.lower) / (*b.upper - *b.lower);
-    if (b.upper) return 1.0 + FromBound(b.value, *b.upper);
-    return b.lower ? -1.0 + FromBound(b.value, *b.lower) : 0.0;
+    if (b.upper) return 1.0 + FromBound(b, *b.upper);
+    return b.lower ? -1.0 + FromBound(b, *b.lower) : 0.0;
 }
 
 T_PLOT UlfPlot(const T_ULF_PICTURE& picture)

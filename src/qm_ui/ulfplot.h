@@ -15,6 +15,7 @@ struct T_ULF_BAR {
     std::optional<double> upper{}, lower{};
     bool active = false;   // it holds the solution
     bool violated = false; // not met
+    double scale = 0.0;    // size of what makes up the value, what is 1e-10 of it is zero
 };
 
 struct T_ULF_PICTURE {
@@ -25,8 +26,8 @@ struct T_ULF_PICTURE {
 };
 
 /// Where a value lies: -1 on its lower bound, 1 on its upper bound, 0 in the middle. With one
-/// bound, 0 is the value zero (a bound of zero: the distance is in parts of the value). Of an
-/// equality, 0 is the target and the deviation is in parts of the larger of target and value.
+/// bound, 0 is the value zero (a bound of zero: the distance is in parts of the scale). Of an
+/// equality, 0 is the target and the deviation is in parts of the larger of target and scale.
 [[nodiscard]] double UlfPosition(const T_ULF_BAR& bar);
 
 /// One row for each constraint, the first on top, with value, unit and bounds as text. Rows of
