@@ -190,10 +190,12 @@ void AddSupports(T_PLOT& plot, const T_SHAPE& shape, const T_VIEW& view)
     if (!out.x.empty()) plot.series.push_back(std::move(out));
 }
 
-std::string LargestText(const T_SHAPE& shape, const T_SHAPE_STATE& s)
+/// `size`: the largest displacement of all states, beside which rounding is nothing.
+std::string LargestText(const T_SHAPE& shape, const T_SHAPE_STATE& s, double size)
 {
+    constexpr double kZero = 1e-12;
     const auto [length, node] = Largest(s);
-    if (!(length > 0.0)) return s.name + ": no displacement of a node";
+    if (!(length > kZero * size)) return s.name + ": no displacement of a node";
     return s.name + FormatText(": largest displacement %.4g %s at node %d", length,
                                shape.lengthUnit.c_str(), shape.nodes[node].id);
 }
@@ -203,6 +205,9 @@ void AddStates(T_PLOT& plot, const T_SHAPE& shape, const T_VIEW& view, double sc
     const std::string times =
         shape.mode ? std::string() : FormatText(", displacements \u00d7 %.10g", scale);
     const bool alone = shape.states.size() == 1;
+    double size = 0.0;
+    for (const T_SHAPE_STATE& s : shape.states)
+        size = std::max(size, Largest(s).first);
     for (std::size_t i = 0; i < shape.states.size(); ++i) {
         const T_SHAPE_STATE& s = shape.states[i];
         if (s.displacement.size() != shape.nodes.size()) continue;
@@ -213,7 +218,7 @@ void AddStates(T_PLOT& plot, const T_SHAPE& shape, const T_VIEW& view, double sc
         line.line = style.line;
         line.width = style.width;
         plot.series.push_back(std::move(line));
-        if (!shape.mode) plot.notes.push_back(LargestText(shape, s));
+        if (!shape.mode) plot.notes.push_back(LargestText(shape, s, size));
     }
 }
 
