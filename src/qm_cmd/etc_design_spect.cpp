@@ -32,9 +32,8 @@ std::vector<double> CodeGrid(const T_SPECT_SHAPE& shape)
 } // namespace
 
 CETC_DESIGN_SPECT::CETC_DESIGN_SPECT(const T_SPFC_D& record, int behaviorType, int limitState,
-                                     int showMode, zql::frx::MDialog* parent)
-    : m_record(record), m_behaviorType(behaviorType), m_limitState(limitState),
-      m_showMode(showMode), m_parent(parent)
+                                     int showMode, zql::frx::MDialog* /*parent*/)
+    : m_record(record), m_behaviorType(behaviorType), m_limitState(limitState), m_showMode(showMode)
 {
     // A derived spectrum computes its own branches at the end of its constructor.
     if (std::holds_alternative<T_SPFC_ATC40>(m_record.data))

@@ -101,7 +101,6 @@ protected:
 private:
     int m_showMode = 0;
     int m_currentDlg = 0;
-    zql::frx::MDialog* m_parent = nullptr;
 };
 
 /// EN 1998-1:2004 elastic spectrum, type 1 or 2 (Tables 3.2 and 3.3).

@@ -12,8 +12,13 @@ void ReadHingeTables(CJsonReader& root, T_MODEL& model)
               });
     ReadTable(root, "hinge_types", units, nullptr, model.hingeTypes,
               [&](CJsonReader& in, const T_PHGT_D& t) {
-                  CheckReference(in, "section",
-                                 t.section == 0 || model.sections.contains(t.section), "section");
+                  const auto isSection = [&](const char* key, int section) {
+                      CheckReference(in, key, section == 0 || model.sections.contains(section),
+                                     "section");
+                  };
+                  isSection("section", t.section);
+                  isSection("fibre_section", t.fibreSection);
+                  isSection("thickness_section", t.thicknessSection);
                   CheckReference(in, "section_material",
                                  t.sectionMaterial == 0 ||
                                      model.materials.contains(t.sectionMaterial),

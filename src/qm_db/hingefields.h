@@ -108,6 +108,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_SKEL_FEMA> r, const T_CURVE_DIMS& given)
     v.PartIf("dc_ratio", r.dcRatio, kDimNone);
     v.Opt("infill_strut", r.infillStrut, d.infillStrut);
     v.Opt("infill_general", r.infillGeneral, d.infillGeneral);
+    v.Opt("compliance_criteria", r.compliance, d.compliance);
 }
 
 template <class V>
@@ -286,6 +287,8 @@ void CaseFields(V& v, T_FIELD_REF<V, T_PHGT_D> r)
     v.EnumOpt("material", r.material, d.material, kMatlNames, "material type");
     v.Opt("section", r.section, 0);
     v.Opt("section_material", r.sectionMaterial, 0);
+    v.Opt("fibre_section", r.fibreSection, 0);
+    v.Opt("thickness_section", r.thicknessSection, 0);
     v.Part("components", r.components, r.definition);
     v.PartIf("yield_surface", r.yieldSurface);
     v.PartIf("pmm", r.pmm);

@@ -86,6 +86,7 @@ struct T_SKEL_FEMA {
     std::optional<T_SIDES<double>> dcRatio; // demand / capacity limits, [0, 1]
     bool infillStrut = false;
     bool infillGeneral = false; // general form, else plastic form
+    bool compliance = true;     // the acceptance criteria are in use
     bool operator==(const T_SKEL_FEMA&) const = default;
 };
 
@@ -197,6 +198,9 @@ struct T_PHGT_D {
     MATL_CLASS material = MATL_CLASS::Steel;
     std::array<T_HINGE_COMPONENT, 6> components; // by HINGE_COMPONENT
     int section = 0, sectionMaterial = 0;        // keys that automatic strengths read; 0: none
+    // Keys of sections; 0: none. The fibres of a frame are those of any section with dimensions and
+    // its bars, the fibres and the thickness of a wall those of a rectangle (its smaller side).
+    int fibreSection = 0, thicknessSection = 0;
     std::optional<T_YIELD_SURFACE> yieldSurface;
     std::optional<T_PMM_TABLE> pmm;
     T_HINGE_LENGTH length;

@@ -2,11 +2,13 @@
 
 #include <algorithm>
 #include <cmath>
+#include <limits>
 #include <numbers>
 #include <utility>
 
 namespace {
 
+constexpr double kInfinite = std::numeric_limits<double>::infinity();
 constexpr double kFar = 1e48;        // radial and vertical lines run out to here
 constexpr double kTolerance = 1e-18; // mathIntersectLine2 raises it to its own smallest
 constexpr double kTouch = 1e-9;      // relative length of a touch
@@ -120,7 +122,7 @@ bool HasZero(const T_ADRS_VIEW& demand, T_RANGE range)
 bool OneSided(const T_POINT2& a, const T_POINT2& b, const T_ADRS_VIEW& demand, T_RANGE range)
 {
     const double rx = b.x - a.x, ry = b.y - a.y;
-    double least = INFINITY, most = -INFINITY, scale = 0.0;
+    double least = kInfinite, most = -kInfinite, scale = 0.0;
     for (std::size_t k = range.first; k <= range.last; ++k) {
         const double up = rx * (demand.Sa[k] - a.y), right = ry * (demand.Sd[k] - a.x);
         least = std::min(least, up - right);

@@ -207,7 +207,8 @@ void DrawLegend(QPainter& painter, const T_PLOT& plot, const T_PLOT_LAYOUT& layo
     for (std::size_t i = 0; i < g.entries.size(); ++i) {
         const T_PLOT_STYLE& s = layout.curves[g.entries[i]].style;
         const double pad = CPlotLayout::kLegendPad;
-        const double x = g.box.x + pad + static_cast<double>(i / g.rows) * g.columnWidth;
+        const std::size_t column = i / g.rows;
+        const double x = g.box.x + pad + static_cast<double>(column) * g.columnWidth;
         const double y = g.box.y + 0.5 * pad + static_cast<double>(i % g.rows) * g.rowHeight;
         const double mid = y + 0.5 * g.rowHeight;
         const double end = x + CPlotLayout::kLegendSample;

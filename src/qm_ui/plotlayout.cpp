@@ -152,7 +152,8 @@ void CPlotLayout::AddNotes(T_PLOT_BOX& rest, T_PLOT_LAYOUT& out) const
     const double top = rest.Bottom() - static_cast<double>(rows) * rowH;
     for (std::size_t i = 0; i < std::min(m_plot.notes.size(), rows * columns); ++i) {
         const bool cut = i + 1 == rows * columns && i + 1 < m_plot.notes.size();
-        const double left = rest.x + static_cast<double>(i / rows) * (widest + kNoteColumnGap);
+        const std::size_t column = i / rows;
+        const double left = rest.x + static_cast<double>(column) * (widest + kNoteColumnGap);
         const double y = top + static_cast<double>(i % rows) * rowH;
         const double w = std::min(widest + 2.0, rest.Right() - left);
         out.texts.push_back({cut ? "\u2026" : m_plot.notes[i],
