@@ -1,6 +1,8 @@
 #include "qm_db/analysismodel.h"
 
+#include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+#include "qm_db/sectionproperties.h"
 #include "qm_db/structnames.h"
 
 #include <algorithm>
@@ -77,9 +79,23 @@ solver::T_MATERIAL MaterialOf(const T_MATL_D& m)
     return {m.E, m.G.value_or(m.E / (2.0 * (1.0 + m.nu))), m.density, m.alpha};
 }
 
-solver::T_SECTION SectionOf(const T_SECT_D& s)
+/// Of a shape with dimensions, what follows from these; zero for a section that is wrong.
+solver::T_SECTION SectionOf(const T_SECT_D& record)
 {
+    T_SECT_D s;
+    SECT_FAULT fault{};
+    if (!CSectionProperties::Calc(record, s, fault)) return {};
     return {s.area, s.Asy, s.Asz, s.J, s.Iyy, s.Izz};
+}
+
+/// What is wrong with a section, empty for nothing.
+std::string SectionFault(const T_SECT_D& record)
+{
+    T_SECT_D ignored;
+    SECT_FAULT fault{};
+    if (CSectionProperties::Calc(record, ignored, fault)) return {};
+    return "section \"" + record.name +
+           "\": " + zql::lib::MMSGFunction::GetValue(MessageKeyOf(fault));
 }
 
 std::vector<std::size_t> IndicesOf(const std::vector<int>& all, const std::vector<int>& ids)
@@ -144,6 +160,8 @@ int CAnalysisModel::AddElement(const T_ELEM_D& e, T_ANALYSIS_ERROR& error)
         const long section = IndexOf(m_sections, e.section);
         if (material == kAbsent) return FailElement(e, "the material is missing", error);
         if (section == kAbsent) return FailElement(e, "the section is missing", error);
+        const std::string fault = SectionFault(m_model.sections.at(e.section));
+        if (!fault.empty()) return FailElement(e, fault, error);
         out.material = static_cast<std::size_t>(material);
         out.section = static_cast<std::size_t>(section);
     }

@@ -1,6 +1,6 @@
 #include "qm_rps/hingetheta.h"
 
-#include "qm_rps/sectionproperties.h"
+#include "qm_db/sectionproperties.h"
 
 #include <cmath>
 
