@@ -167,7 +167,8 @@ T_VEC12 CBeamElement::FixedEndForces(std::span<const T_SPAN_LOAD> loads, double 
     return forces;
 }
 
-T_VEC12 CBeamElement::EndForces(const T_VEC12& displacement, const T_VEC12& fixedEnd) const
+/// Displacements of the nodes taken to the ends of the flexible length, local axes.
+T_VEC12 CBeamElement::EndDisplacements(const T_VEC12& displacement) const
 {
     T_VEC12 local;
     for (std::size_t end = 0; end < 12; end += 6) {
@@ -178,6 +179,31 @@ T_VEC12 CBeamElement::EndForces(const T_VEC12& displacement, const T_VEC12& fixe
         std::copy(u.begin(), u.end(), local.begin() + static_cast<long>(end));
         std::copy(r.begin(), r.end(), local.begin() + static_cast<long>(end) + 3);
     }
+    return local;
+}
+
+double CBeamElement::StrainEnergy(const T_VEC12& displacement) const
+{
+    const T_VEC12 u = EndDisplacements(displacement);
+    // Less the rigid-body motion of I's translation, the chord's rotation and I's twist.
+    const double chordY = (u[2] - u[8]) / m_shape.length, chordZ = (u[7] - u[1]) / m_shape.length;
+    T_VEC12 strain{};
+    strain[4] = u[4] - chordY;
+    strain[5] = u[5] - chordZ;
+    strain[6] = u[6] - u[0];
+    strain[9] = u[9] - u[3];
+    strain[10] = u[10] - chordY;
+    strain[11] = u[11] - chordZ;
+    double energy = 0.0;
+    for (std::size_t i = 0; i < 12; ++i)
+        for (std::size_t j = 0; j < 12; ++j)
+            energy += strain[i] * m_local[i][j] * strain[j];
+    return energy;
+}
+
+T_VEC12 CBeamElement::EndForces(const T_VEC12& displacement, const T_VEC12& fixedEnd) const
+{
+    const T_VEC12 local = EndDisplacements(displacement);
     T_VEC12 forces = fixedEnd;
     for (std::size_t i = 0; i < 12; ++i)
         for (std::size_t j = 0; j < 12; ++j)

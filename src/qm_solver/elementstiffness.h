@@ -25,4 +25,8 @@ double TrussStiffness(const T_FRAME& frame, const T_ELEMENT& element, double len
 /// direction, without levers: a link of some length passes its shear without the moment.
 void ElementStiffness(const T_FRAME& frame, const T_ELEMENT& element, T_MATRIX12& stiffness);
 
+/// Twice the strain energy of an element under displacements of its nodes (global axes), from its
+/// deformations: a motion that does not strain it leaves only the square of its rounding.
+double StrainEnergy(const T_FRAME& frame, const T_ELEMENT& element, const T_VEC12& displacement);
+
 } // namespace solver
