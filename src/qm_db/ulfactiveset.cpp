@@ -65,7 +65,7 @@ void CUlfActiveSet::Start(std::span<const std::size_t> rows)
 {
     for (std::size_t row : rows) {
         Direct(row);
-        Activate(row, 0.0L);
+        if (m_dir.zz > kDependentTol * kDependentTol) Activate(row, 0.0L);
     }
     Refine();
 }

@@ -21,8 +21,8 @@ public:
     /// g, and the factor by which the caps of the elastic rows grow. Keeps the active rows, without
     /// those whose multiplier has left its range.
     void SetObjective(std::span<const double> gradient, double capFactor);
-    /// Makes independent rows active before the first Solve; their multipliers must come out
-    /// within their range for the gradient set before.
+    /// Makes rows active before the first Solve, without those that depend on the others. Their
+    /// multipliers must come out within their range for the gradient set before.
     void Start(std::span<const std::size_t> rows);
     /// Meets all rows with an index from `begin` up to `end`, keeping those met before.
     ULF_STEP Solve(std::size_t begin, std::size_t end);

@@ -15,6 +15,7 @@ constexpr double kHeldTols[] = {1e-6, 1e-8,
 struct T_FACE {
     T_ULF_ROWS rows;
     std::vector<double> cost;
+    std::vector<std::size_t> held; // rows with a multiplier
 };
 
 /// A row with a multiplier holds as an equality. An elastic row at its cap stays violated, and the
@@ -22,7 +23,7 @@ struct T_FACE {
 T_FACE Face(const T_ULF_LINEAR& linear, const std::vector<double>& multipliers, double heldTol)
 {
     const T_ULF_ROWS& from = linear.rows;
-    T_FACE face{from, linear.cost};
+    T_FACE face{from, linear.cost, {}};
     for (std::size_t i = 0; i < from.Size(); ++i) {
         const double held = multipliers[i], cap = from.cap[i];
         face.rows.cap[i] = T_ULF_ROWS::kHard;
@@ -32,6 +33,7 @@ T_FACE Face(const T_ULF_LINEAR& linear, const std::vector<double>& multipliers, 
             row.a = -row.a;
         } else if (std::fabs(held) > heldTol) {
             face.rows.equality[i] = true;
+            face.held.push_back(i);
         }
     }
     return face;
@@ -60,11 +62,12 @@ void SolveOnFace(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& scaled,
     std::vector<double> held = vertex.multipliers;
     for (int round = 0; round < kRounds; ++round) {
         const T_FACE face = Face(linear, held, heldTol);
-        CUlfActiveSet method(face.rows);
+        CUlfActiveSet prices(face.rows), method(face.rows);
+        prices.Start(face.held);
+        std::vector<long double> multipliers = prices.MultipliersOf(face.cost, 0.0);
+        if (Release(linear, face, multipliers, held, heldTol)) continue;
         if (method.Solve(0, face.rows.Size()) != ULF_STEP::Done) return;
         answer.steps += method.Steps();
-        std::vector<long double> multipliers = method.MultipliersOf(face.cost, 0.0);
-        if (Release(linear, face, multipliers, held, heldTol)) continue;
         multipliers.resize(scaled.nCon);
         AcceptUlf(problem, scaled, method.Y().first(scaled.nVar), std::move(multipliers), answer);
         return;

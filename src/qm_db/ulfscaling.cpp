@@ -7,6 +7,8 @@ namespace {
 
 constexpr double kLargestRhs = 1e300; // beyond it a scaled right-hand side is no bound at all
 
+constexpr long double kNoise = 1e-17L; // part of the largest factor that is rounding
+
 bool AllFinite(std::span<const double> values)
 {
     return std::all_of(values.begin(), values.end(), [](double v) { return std::isfinite(v); });
@@ -89,7 +91,14 @@ T_ULF_SCALED ScaleUlf(const T_ULF_PROBLEM& problem)
 std::vector<double> UnscaleUlf(const T_ULF_SCALED& scaled, std::span<const long double> y)
 {
     std::vector<double> x(scaled.nVar);
-    for (std::size_t j = 0; j < scaled.nVar; ++j)
-        x[j] = static_cast<double>(y[j] * scaled.rhsScale / scaled.weight[j]);
+    long double size = 0.0L;
+    for (long double v : y)
+        size = std::max(size, std::fabs(v));
+    for (std::size_t j = 0; j < scaled.nVar; ++j) {
+        const bool isNoise = std::fabs(y[j]) <= kNoise * size;
+        const bool isPastSign = scaled.sign * y[j] < 0.0L; // within the tolerance of a row
+        if (!isNoise && !isPastSign)
+            x[j] = static_cast<double>(y[j] * scaled.rhsScale / scaled.weight[j]);
+    }
     return x;
 }

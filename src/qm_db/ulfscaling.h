@@ -23,7 +23,8 @@ struct T_ULF_SCALED {
 /// The problem must have passed CheckUlfProblem.
 T_ULF_SCALED ScaleUlf(const T_ULF_PROBLEM& problem);
 
-/// The factors x of a scaled solution, rounded to double.
+/// The factors x of a scaled solution, rounded to double; what is only rounding, and what is past
+/// the sign by less than a tolerance, becomes zero.
 std::vector<double> UnscaleUlf(const T_ULF_SCALED& scaled, std::span<const long double> y);
 
 /// The weights as the square sum counts them, all positive.

@@ -89,10 +89,12 @@ TEST(HingeGenerator, GivesElementsTheirStrengthsAsOneEdit)
 
     // Another hinge of the element goes when it is generated again, the first keeps its key.
     ASSERT_EQ(1, doc.Edit().Begin("second"));
-    ASSERT_EQ(1, doc.Edit().Put(5, T_PHGE_D{1, 3, {}, {}}));
+    for (const auto& [key, element] : {std::pair(5, 1), std::pair(6, 4), std::pair(7, 4)})
+        ASSERT_EQ(1, doc.Edit().Put(key, T_PHGE_D{element, 3, {}, {}}));
     ASSERT_EQ(1, doc.Edit().Commit());
     ASSERT_EQ(1, CHingeGenerator(doc).Generate(1, {1}, refusal));
-    EXPECT_EQ(1u, doc.Data().Model().hinges.size());
+    EXPECT_EQ(3u, doc.Data().Model().hinges.size()); // 1, and both of element 4
+    EXPECT_FALSE(doc.Data().Model().hinges.contains(5));
     for (int step = 0; step < 3; ++step)
         ASSERT_EQ(1, doc.Undo().Undo());
     EXPECT_EQ(before, doc.Data().Model());

@@ -82,68 +82,20 @@ TEST(HingeTypeLists, OfferSectionsByTheirShape)
 TEST(HingeTypeMode, FollowsElementDefinitionAndInteraction)
 {
     T_PHGT_D t;
-    EXPECT_EQ("sss"
-              "e-"
-              "--"
-              "-"
-              "s"
-              "e"
-              "-"
-              "-",
-              ModeOf(t));
+    EXPECT_EQ("ssse----se--", ModeOf(t));
     t.components[4].active = true;
     t.interaction = HINGE_INTERACTION::PMM;
-    EXPECT_EQ("ees"
-              "e-"
-              "--"
-              "-"
-              "s"
-              "e"
-              "-"
-              "-",
-              ModeOf(t));
+    EXPECT_EQ("eese----se--", ModeOf(t));
     t.interaction = HINGE_INTERACTION::User;
     t.material = MATL_CLASS::Masonry;
-    EXPECT_EQ("ese"
-              "e-"
-              "--"
-              "-"
-              "s"
-              "e"
-              "e"
-              "-",
-              ModeOf(t));
+    EXPECT_EQ("esee----see-", ModeOf(t));
     t.element = HINGE_ELEMENT::Wall;
     t.definition = HINGE_DEFINITION::CurvatureDistributed;
-    EXPECT_EQ("ese"
-              "ee"
-              "-e"
-              "e"
-              "s"
-              "e"
-              "e"
-              "-",
-              ModeOf(t));
+    EXPECT_EQ("eseee-eesee-", ModeOf(t));
     t.element = HINGE_ELEMENT::Truss;
-    EXPECT_EQ("---"
-              "e-"
-              "e-"
-              "-"
-              "-"
-              "-"
-              "-"
-              "s",
-              ModeOf(t));
+    EXPECT_EQ("---e-e-----s", ModeOf(t));
     t.components[0].active = true; // the FEMA curve alone is offered there
-    EXPECT_EQ("---"
-              "e-"
-              "e-"
-              "-"
-              "-"
-              "-"
-              "-"
-              "e",
-              ModeOf(t));
+    EXPECT_EQ("---e-e-----e", ModeOf(t));
     t.element = HINGE_ELEMENT::PointSpring;
     EXPECT_EQ("------------", ModeOf(t));
     EXPECT_FALSE(CPO_HingeTypeDlg::HasComponent(HINGE_ELEMENT::Truss, C::My));

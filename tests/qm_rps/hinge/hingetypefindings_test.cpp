@@ -1,5 +1,6 @@
 // Rules of a whole hinge type: what it refers to, codes, symmetry, automatic strengths, parts.
 #include "hingesample.h"
+#include "qm_rps/hingemirror.h"
 #include "qm_rps/hingepreview.h"
 #include "qm_rps/hingetypefindings.h"
 #include "qm_rps/po_hingeskcvtabfemadlg.h"
@@ -201,6 +202,16 @@ TEST(HingeTypeFindings, InactiveCriteriaAreNotChecked)
             {"inactive", [](T& t) { Fema(t).sides.pos.IO = 5, Fema(t).compliance = false; }},
         },
         Context());
+}
+
+TEST(HingeMirror, KeepsTheGapOfEachSide)
+{
+    T_SKEL_MULTI m;
+    m.sides.pos.P1 = 10, m.sides.pos.gap = 0.5, m.sides.neg.gap = 0.25;
+    const auto c = MirroredComponent(ComponentWith(SKEL_TYPE::SlipBilinear, m));
+    const T_SKEL_MULTI_SIDE& neg = std::get<T_SKEL_MULTI>(c.curves.J).sides.neg;
+    EXPECT_EQ(10, neg.P1);
+    EXPECT_EQ(0.25, neg.gap);
 }
 
 TEST(HingeCriteria, AreShownAsInactiveAndLeaveThePicture)
