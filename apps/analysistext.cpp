@@ -137,6 +137,23 @@ std::string BeamTable(const T_CASE_RESULTS& r, const T_UNITS& units)
     return text;
 }
 
+/// Without what rounding has left beside the largest of all modes.
+T_DOF6 Cleaned(T_DOF6 values, double largest)
+{
+    for (double& v : values)
+        if (std::fabs(v) <= 1e-10 * largest) v = 0.0;
+    return values;
+}
+
+double LargestOf(const std::vector<T_MODE_RESULTS>& modes, T_DOF6 T_MODE_RESULTS::*member)
+{
+    double largest = 0.0;
+    for (const T_MODE_RESULTS& mode : modes)
+        for (const double v : mode.*member)
+            largest = std::max(largest, std::fabs(v));
+    return largest;
+}
+
 } // namespace
 
 std::string ForceName(const T_UNITS& units)
@@ -236,13 +253,15 @@ std::string ModeTable(const std::vector<T_MODE_RESULTS>& modes)
     T_DOF6 sum{};
     for (std::size_t i = 0; i < modes.size(); ++i) {
         text += FormatText("%10zu", i + 1) + Column(modes[i].period) +
-                Columns(modes[i].massPercent) + "\n";
+                Columns(Cleaned(modes[i].massPercent, 100.0)) + "\n";
         for (std::size_t k = 0; k < sum.size(); ++k)
             sum[k] += modes[i].massPercent[k];
     }
-    text += FormatText("%10s %13s", "sum", "") + Columns(sum) + "\n\nparticipation factors\n" +
-            Head("mode", {"X", "Y", "Z", "RX", "RY", "RZ"});
+    text += FormatText("%10s %13s", "sum", "") + Columns(Cleaned(sum, 100.0)) +
+            "\n\nparticipation factors\n" + Head("mode", {"X", "Y", "Z", "RX", "RY", "RZ"});
+    const double largest = LargestOf(modes, &T_MODE_RESULTS::participation);
     for (std::size_t i = 0; i < modes.size(); ++i)
-        text += FormatText("%10zu", i + 1) + Columns(modes[i].participation) + "\n";
+        text +=
+            FormatText("%10zu", i + 1) + Columns(Cleaned(modes[i].participation, largest)) + "\n";
     return text;
 }

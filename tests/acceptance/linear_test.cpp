@@ -119,6 +119,35 @@ TEST(Linear, TrussArchGivesTheRecordedResults)
     ExpectRecorded("truss-arch", "truss_arch", 17 * (26 * 2 + 2 * 2 + 49));
 }
 
+TEST(Linear, NineModesOfThreeRigidFloorsTakeAllOfTheirMass)
+{
+    const CTempFolder folder;
+    const T_RUN run = RunProgram(
+        {"analyse", ExampleCase("space-frame-3d"), "--modes", "9", "--json", folder / "r.json"});
+    ASSERT_EQ(0, run.code) << run.err;
+    EXPECT_NE(std::string::npos, run.out.find("T (s)"));
+    const json results = json::parse(ReadText(folder / "r.json"));
+    const json& modes = results.at("modes");
+    ASSERT_EQ(9U, modes.size());
+    double sum[6] = {};
+    for (std::size_t i = 0; i < modes.size(); ++i) {
+        const json& mode = modes[i];
+        EXPECT_LE(mode.at("period"), modes[i > 0 ? i - 1 : 0].at("period"));
+        for (std::size_t k = 0; k < 6; ++k)
+            sum[k] += mode.at("mass_percent").at(k).get<double>();
+        // Nodes 101 and 107 stand 10 m apart in y on one floor: it moves as a rigid body.
+        const json &a = mode.at("shape").at("101"), &b = mode.at("shape").at("107");
+        const double rz = a.at(5), dx = b.at(0).get<double>() - a.at(0).get<double>();
+        EXPECT_NEAR(-10.0 * rz, dx, 1e-10);
+        EXPECT_NEAR(rz, b.at(5).get<double>(), 1e-10);
+    }
+    for (const std::size_t k : {0U, 1U, 5U}) // columns that stretch keep a trace for themselves
+        EXPECT_NEAR(100.0, sum[k], 1e-3) << k;
+    // By hand: warm girders between rigid floors are compressed with E A alpha 20 degrees.
+    for (const json& row : results.at("beam").at("T").at("10"))
+        EXPECT_NEAR(-3.3e7 * 0.165 * 1e-5 * 20.0, row.at(0).get<double>(), 1e-6);
+}
+
 TEST(Linear, CombinationsAreSuperposed)
 {
     const T_RUN run = RunProgram({"analyse", ExampleCase("cable-stayed-bridge"), "--case",
