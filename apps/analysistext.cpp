@@ -92,6 +92,49 @@ std::string ModeObject(const T_MODE_RESULTS& mode)
            ",\n   \"shape\": " + IdObject(mode.shape, NumberList) + "\n  }";
 }
 
+constexpr double kModeRounding = 1e-10; // of the largest of all modes
+constexpr double kCaseRounding = 1e-12; // of the largest of a load case
+
+/// Without what rounding has left beside the largest.
+T_DOF6 Cleaned(T_DOF6 values, double largest, double part = kModeRounding)
+{
+    for (double& v : values)
+        if (std::fabs(v) <= part * largest) v = 0.0;
+    return values;
+}
+
+template <class ROWS>
+void Grow(double& largest, const ROWS& rows)
+{
+    for (const auto& row : rows)
+        for (const double v : row.value)
+            largest = std::max(largest, std::fabs(v));
+}
+
+/// The results as the tables show them: displacements, and forces with moments, without rounding.
+T_CASE_RESULTS WithoutRounding(T_CASE_RESULTS r)
+{
+    double moved = 0.0, force = 0.0;
+    Grow(moved, r.displacements);
+    Grow(force, r.reactions);
+    for (const auto& row : r.trusses)
+        force = std::max(force, std::fabs(row.value));
+    for (const auto& row : r.beams)
+        for (const T_DOF6& at : row.value)
+            for (const double v : at)
+                force = std::max(force, std::fabs(v));
+    for (auto& row : r.displacements)
+        row.value = Cleaned(row.value, moved, kCaseRounding);
+    for (auto& row : r.reactions)
+        row.value = Cleaned(row.value, force, kCaseRounding);
+    for (auto& row : r.trusses)
+        if (std::fabs(row.value) <= kCaseRounding * force) row.value = 0.0;
+    for (auto& row : r.beams)
+        for (T_DOF6& at : row.value)
+            at = Cleaned(at, force, kCaseRounding);
+    return r;
+}
+
 struct T_LARGEST {
     double value = 0.0;
     int id = 0;
@@ -135,14 +178,6 @@ std::string BeamTable(const T_CASE_RESULTS& r, const T_UNITS& units)
         }
     }
     return text;
-}
-
-/// Without what rounding has left beside the largest of all modes.
-T_DOF6 Cleaned(T_DOF6 values, double largest)
-{
-    for (double& v : values)
-        if (std::fabs(v) <= 1e-10 * largest) v = 0.0;
-    return values;
 }
 
 double LargestOf(const std::vector<T_MODE_RESULTS>& modes, T_DOF6 T_MODE_RESULTS::*member)
@@ -191,8 +226,10 @@ std::string AnalysisJson(const std::vector<T_SHOWN_CASE>& shown,
     return text + (modes.empty() ? "]\n}\n" : "\n ]\n}\n");
 }
 
-std::string CaseTables(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& r, const T_UNITS& units)
+std::string CaseTables(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& results,
+                       const T_UNITS& units)
 {
+    const T_CASE_RESULTS r = WithoutRounding(results);
     const std::string force = ForceName(units), length = LengthName(units);
     std::string text =
         "\n== " + shown.name + "\n\ndisplacements\n" + Head("node", Dofs("D", length, "R", "rad"));

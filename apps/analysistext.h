@@ -12,7 +12,8 @@ std::string AnalysisJson(const std::vector<T_SHOWN_CASE>& shown,
                          const std::vector<T_CASE_RESULTS>& results,
                          const std::vector<T_MODE_RESULTS>& modes);
 
-/// Tables of one load case: displacements, reactions, truss and beam forces.
+/// Tables of one load case: displacements, reactions, truss and beam forces. What is below 1e-12 of
+/// the largest displacement or force is rounding and is shown as 0.
 std::string CaseTables(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& results,
                        const T_UNITS& units);
 /// The largest values of one load case, and the sum of the reactions.
