@@ -91,7 +91,7 @@ T_ULF_OUTCOME SolveUlf(CUnknownLoadFactorItemDlg& dialog)
     const bool solved = dialog.OnCalculate();
     const auto& run = dialog.LastRun();
     if (run) out.solverCode = run->answer.code;
-    out.exact = run ? run->answer.exact : dialog.m_solveByEquations;
+    out.exact = dialog.m_solveByEquations || (run && run->answer.exact);
     if (!dialog.Messages().empty()) out.message = OneLine(dialog.Messages().back().text);
     if (solved) {
         out.exact = dialog.Result()->exact;
