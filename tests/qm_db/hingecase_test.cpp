@@ -1,8 +1,6 @@
 // Hinges, and what they refer to, in the case file and in the model file.
-#include "modelstoresample.h"
+#include "casetext.h"
 #include "qm_base/msgfunction.h"
-#include "qm_db/casefile.h"
-#include "qm_db/filectrl.h"
 #include "qm_db/hingetype.h"
 #include "qm_db/sqlitedb.h"
 
@@ -15,41 +13,7 @@ const std::string kData = QM_TEST_DATA;
 
 std::string RichText()
 {
-    std::string text;
-    T_FILE_ERROR error;
-    EXPECT_EQ(1, CFileCtrl::ReadWholeFile(kData + "/cases/hinge_all_members.json", text, error));
-    return text;
-}
-
-T_MODEL_CONTENT ParseGood(const std::string& text)
-{
-    T_MODEL_CONTENT content;
-    T_FILE_ERROR error;
-    EXPECT_EQ(1, CCaseFile::Parse(text, "case.json", "", content, error)) << error.text;
-    return content;
-}
-
-std::string PrintGood(const T_MODEL_CONTENT& content)
-{
-    std::string text;
-    T_FILE_ERROR error;
-    EXPECT_EQ(1, CCaseFile::Print(content, text, error)) << error.text;
-    return text;
-}
-
-/// Through both file forms; the model must come back equal, and its text too.
-void ExpectRoundTrips(const T_MODEL_CONTENT& content, const std::string& label)
-{
-    const CTempFolder folder;
-    const std::string path = folder.File("m.qmdb");
-    const std::string text = PrintGood(content);
-    EXPECT_TRUE(SameContent(content, ParseGood(text))) << label;
-    T_MODEL_CONTENT stored;
-    T_FILE_ERROR error;
-    ASSERT_EQ(1, CModelStore().Save(path, content, error)) << label << error.text;
-    ASSERT_EQ(1, CModelStore().Open(path, OPEN_MODE::ReadOnly, stored, error)) << error.text;
-    EXPECT_TRUE(SameContent(content, stored)) << label;
-    EXPECT_EQ(text, PrintGood(stored)) << label;
+    return CaseText("hinge_all_members.json");
 }
 
 T_HINGE_COMPONENT& Component(T_MODEL_CONTENT& content, HINGE_COMPONENT c)
@@ -131,29 +95,15 @@ TEST(HingeCase, EveryChoiceOfEveryListComesBack)
     }
 }
 
-// A value goes through every unit without losing a bit.
 TEST(HingeCase, IsLosslessInEveryUnit)
 {
-    const T_MODEL_CONTENT content = ParseGood(RichText());
-    for (int i = 0; i < 35; ++i) {
-        T_MODEL_CONTENT other = content;
-        other.model.styp.units = {static_cast<FORCE_UNIT>(i % 7), static_cast<LENGTH_UNIT>(i / 7)};
-        const T_MODEL_CONTENT once = ParseGood(PrintGood(other));
-        EXPECT_EQ(PrintGood(other), PrintGood(once)) << i;
-        EXPECT_TRUE(SameContent(once, ParseGood(PrintGood(once)))) << i;
-    }
+    ExpectLosslessInEveryUnit(ParseGood(RichText()));
 }
 
 TEST(HingeCase, BadInputNamesThePlace)
 {
-    struct T_ROW {
-        const char* after; // text before the place
-        const char* from;
-        const char* to;
-        const char* message;
-    };
     // clang-format off
-    const T_ROW rows[] = {
+    const T_SPOILT rows[] = {
         {"design_codes", "concrete", "conc", "design_codes: unknown key \"conc\""},
         {"\"materials\"", "\"C30\"", "\"A992\"", "materials[1].name: \"A992\" appears twice"},
         {"\"materials\"", "\"key\": 3", "\"key\": 1", "materials[1].key: keys must rise, from 1"},
@@ -171,24 +121,7 @@ TEST(HingeCase, BadInputNamesThePlace)
         {"\"pushover\"", "\"force\"", "\"push\"", "pushover[0].control.increment_method: unknown increment method \"push\"; allowed: force, displacement"},
     };
     // clang-format on
-    const std::string good = RichText();
-    for (const T_ROW& row : rows) {
-        std::string text = good;
-        const std::size_t after = text.find(row.after);
-        const std::size_t at = text.find(row.from, after);
-        ASSERT_NE(std::string::npos, after) << row.after;
-        ASSERT_NE(std::string::npos, at) << row.from;
-        text.replace(at, std::string(row.from).size(), row.to);
-        T_MODEL_CONTENT content;
-        T_FILE_ERROR error;
-        EXPECT_EQ(0, CCaseFile::Parse(text, "f", "", content, error)) << row.message;
-        EXPECT_EQ(T_MODEL{}, content.model);
-        if (row.message != std::string("not valid JSON")) {
-            EXPECT_EQ(std::string("f: ") + row.message, error.text);
-        } else {
-            EXPECT_EQ(FILE_FAULT::BadInput, error.fault) << error.text;
-        }
-    }
+    ExpectRefused(RichText(), rows);
 }
 
 TEST(HingeCase, RefusesToStoreWhatCouldNotBeRead)

@@ -1,7 +1,5 @@
 // Structure, loads, combinations and unknown load factors in the case file and in the model file.
-#include "modelstoresample.h"
-#include "qm_db/casefile.h"
-#include "qm_db/filectrl.h"
+#include "casetext.h"
 #include "qm_db/recordunits.h"
 
 #include <cmath>
@@ -11,40 +9,7 @@ namespace {
 
 std::string AllText()
 {
-    std::string text;
-    T_FILE_ERROR error;
-    EXPECT_EQ(1,
-              CFileCtrl::ReadWholeFile(QM_TEST_DATA "/cases/struct_all_members.json", text, error));
-    return text;
-}
-
-int Parse(const std::string& text, T_MODEL_CONTENT& content, T_FILE_ERROR& error)
-{
-    return CCaseFile::Parse(text, "case.json", "", content, error);
-}
-
-T_MODEL_CONTENT ParseGood(const std::string& text)
-{
-    T_MODEL_CONTENT content;
-    T_FILE_ERROR error;
-    EXPECT_EQ(1, Parse(text, content, error)) << error.text;
-    return content;
-}
-
-std::string PrintGood(const T_MODEL_CONTENT& content)
-{
-    std::string text;
-    T_FILE_ERROR error;
-    EXPECT_EQ(1, CCaseFile::Print(content, text, error)) << error.text;
-    return text;
-}
-
-/// The text with one piece replaced, the first one behind `after`.
-std::string Spoilt(std::string text, const char* after, const char* from, const char* to)
-{
-    const std::size_t at = text.find(from, text.find(after));
-    EXPECT_NE(std::string::npos, at) << after << ": " << from;
-    return at == std::string::npos ? text : text.replace(at, std::string(from).size(), to);
+    return CaseText("struct_all_members.json");
 }
 
 } // namespace
@@ -53,15 +18,7 @@ TEST(StructCase, TheTextOfEveryMemberComesBackLetterForLetter)
 {
     const T_MODEL_CONTENT content = ParseGood(AllText());
     EXPECT_EQ(AllText(), PrintGood(content));
-
-    const CTempFolder folder;
-    const std::string path = folder.File("m.qmdb");
-    T_MODEL_CONTENT stored;
-    T_FILE_ERROR error;
-    ASSERT_EQ(1, CModelStore().Save(path, content, error)) << error.text;
-    ASSERT_EQ(1, CModelStore().Open(path, OPEN_MODE::ReadOnly, stored, error)) << error.text;
-    EXPECT_TRUE(SameContent(content, stored));
-    EXPECT_EQ(AllText(), PrintGood(stored));
+    ExpectRoundTrips(content, "all members");
 }
 
 // From kN and m by hand: 1 kN = 1000 N; mass kN s2/m = 1000 kg.
@@ -143,26 +100,13 @@ TEST(StructCase, EveryChoiceOfEveryListComesBack)
 
 TEST(StructCase, IsLosslessInEveryUnit)
 {
-    const T_MODEL_CONTENT content = ParseGood(AllText());
-    for (int i = 0; i < 35; ++i) {
-        T_MODEL_CONTENT other = content;
-        other.model.styp.units = {static_cast<FORCE_UNIT>(i % 7), static_cast<LENGTH_UNIT>(i / 7)};
-        const T_MODEL_CONTENT once = ParseGood(PrintGood(other));
-        EXPECT_EQ(PrintGood(other), PrintGood(once)) << i;
-        EXPECT_TRUE(SameContent(once, ParseGood(PrintGood(once)))) << i;
-    }
+    ExpectLosslessInEveryUnit(ParseGood(AllText()));
 }
 
 TEST(StructCase, BadInputNamesThePlace)
 {
-    struct T_ROW {
-        const char* after; // text before the place
-        const char* from;
-        const char* to;
-        const char* message;
-    };
     // clang-format off
-    const T_ROW rows[] = {
+    const T_SPOILT rows[] = {
         {"", "\"XZ\"", "\"ZX\"", "plane: unknown plane \"ZX\"; allowed: XY, XZ, YZ"},
         {"materials", "\"fy\"", "\"Fy\": 1, \"fy\"", "materials[0].fy: the same as \"Fy\", which is there too"},
         {"materials", "\"G\": 81", "\"G\": -81", "materials[0].G: a shear modulus must be above 0"},
@@ -228,15 +172,7 @@ TEST(StructCase, BadInputNamesThePlace)
         {"ulf_items", "[\"D5\", \"not, there\"]", "[\"D5\", 5]", "ulf_items[0].constraints[1]: expected a text, found a number"},
     };
     // clang-format on
-    const T_MODEL_CONTENT before = ParseGood(AllText());
-    for (const T_ROW& row : rows) {
-        T_MODEL_CONTENT content = before;
-        T_FILE_ERROR error;
-        EXPECT_EQ(0, Parse(Spoilt(AllText(), row.after, row.from, row.to), content, error))
-            << row.message;
-        EXPECT_EQ(std::string("case.json: ") + row.message, error.text);
-        EXPECT_TRUE(SameContent(before, content)) << row.message;
-    }
+    ExpectRefused(AllText(), rows);
 }
 
 TEST(StructCase, WhatCannotBeReadIsNotWritten)
