@@ -1,6 +1,6 @@
 # Compiles every public header of the rooms alone, so that none leans on another's includes.
 set(header_sources)
-set(rooms qm_base qm_db qm_cmd qm_rps)
+set(rooms qm_base qm_solver qm_db qm_cmd qm_rps)
 if(QM_UI)
   list(APPEND rooms qm_ui)
 endif()

@@ -1,7 +1,7 @@
 # Install and export, so that another project can find_package(qm_rps) and link qm::rps.
 include(CMakePackageConfigHelpers)
 
-set(rooms qm_base qm_db qm_cmd qm_rps)
+set(rooms qm_base qm_solver qm_db qm_cmd qm_rps)
 if(QM_UI)
   list(APPEND rooms qm_ui)
 endif()

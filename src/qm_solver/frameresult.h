@@ -11,6 +11,20 @@ namespace solver {
 inline constexpr std::size_t kBeamPositions = 5;
 
 /// Results of one load case, all arrays by the model's indices.
+///
+/// Signs of beam forces. They act on the face whose outward normal is local x (towards J), that of
+/// the part from I to the cut:
+///   axial     along +x: tension
+///   shear y   along +y        d(moment z)/dx = -(shear y)
+///   shear z   along +z        d(moment y)/dx = +(shear z)
+///   torsion   turns +x by the right hand
+///   moment y  turns +y: tension on the side of +z
+///   moment z  turns +z: tension on the side of -y
+/// so that the normal stress is N / A + (moment y) z / Iy - (moment z) y / Iz. A beam along X with
+/// z up, under its own weight on two supports, has a negative moment y at mid-span (tension below)
+/// and a shear z that goes from minus to plus half of its weight.
+/// At a point load or moment exactly on a position the cut lies just before it; at J all loads lie
+/// before the cut, at I none, so that both ends give the forces of the ends.
 struct T_RESULT {
     std::vector<T_VEC6> displacement; // by node, global
     /// By node, global: force of supports and point springs on the structure; 0 elsewhere.
@@ -46,6 +60,7 @@ struct T_SOLVER_ERROR {
     SOLVER_FAULT fault = SOLVER_FAULT::None;
     /// Index of the node or element that is at fault, -1 for none.
     long node = -1, element = -1;
+    long loadCase = -1; // index of the load case at fault, -1 for none
     int direction = -1; // 0 to 5, of a mechanism at a node
     /// Nodes of a part of the model that moves as a rigid body; empty otherwise.
     std::vector<std::size_t> part;

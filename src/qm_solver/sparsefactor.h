@@ -22,7 +22,13 @@ struct T_SYMMETRIC_MATRIX {
 struct T_FACTOR_INFO {
     double factorBytes = 0.0;            // memory of the factor
     double peakBytes = 0.0;              // memory that the factorisation needed
+    std::size_t negativePivots = 0;      // negative eigenvalues (Sylvester's law of inertia)
     std::vector<std::size_t> nullPivots; // equations whose pivot vanished, ascending
+};
+
+enum class PIVOTS {
+    Watch,     // vanishing pivots are listed and their unknowns blocked
+    AsTheyAre, // used however small they are: for a matrix known to be regular
 };
 
 class CSparseFactor {
@@ -37,11 +43,12 @@ public:
     /// 1 done; 0 `reason` filled.
     [[nodiscard]] int Analyse(const T_SYMMETRIC_MATRIX& matrix, std::span<const int> block,
                               std::string& reason);
-    /// Numeric phase; the pattern is that of Analyse. Vanishing pivots are no failure: they are
-    /// listed in Info. 1 done; 0 `reason` filled.
-    [[nodiscard]] int Factor(const T_SYMMETRIC_MATRIX& matrix, std::string& reason);
+    /// Numeric phase; the pattern is that of Analyse. Watched pivots that vanish are no failure:
+    /// they are listed in Info. 1 done; 0 `reason` filled.
+    [[nodiscard]] int Factor(const T_SYMMETRIC_MATRIX& matrix, std::string& reason,
+                             PIVOTS pivots = PIVOTS::Watch);
     /// Solves for `count` right-hand sides, column after column, in place; blocks of up to 64.
-    /// 1 done; 0 `reason` filled, rhs undefined.
+    /// The unknown of a vanished pivot is set to 0. 1 done; 0 `reason` filled, rhs undefined.
     [[nodiscard]] int Solve(std::span<double> rhs, std::size_t count, std::string& reason);
     const T_FACTOR_INFO& Info() const;
 

@@ -1,0 +1,25 @@
+# The sparse direct solver and its ordering: targets qm_mumps and qm_metis.
+# Debian: libmumps-seq-dev libmetis-dev libopenblas-dev libeigen3-dev libspectra-dev
+
+# qm_system_library(<target> <package> HEADER h LIBS a b ...)
+function(qm_system_library target package)
+  cmake_parse_arguments(LIB "" "HEADER" "LIBS" ${ARGN})
+  add_library(${target} INTERFACE IMPORTED GLOBAL)
+  find_path(${target}_INCLUDE ${LIB_HEADER} PATH_SUFFIXES mumps_seq mumps MUMPS openblas)
+  if(NOT ${target}_INCLUDE)
+    message(FATAL_ERROR "${LIB_HEADER} is missing: install ${package}")
+  endif()
+  target_include_directories(${target} SYSTEM INTERFACE ${${target}_INCLUDE})
+  foreach(lib ${LIB_LIBS})
+    find_library(${target}_${lib} ${lib})
+    if(NOT ${target}_${lib})
+      message(FATAL_ERROR "the library ${lib} is missing: install ${package}")
+    endif()
+    target_link_libraries(${target} INTERFACE ${${target}_${lib}})
+  endforeach()
+  mark_as_advanced(${target}_INCLUDE)
+endfunction()
+
+qm_system_library(qm_mumps libmumps-seq-dev HEADER dmumps_c.h LIBS dmumps_seq mumps_common_seq mpiseq_seq)
+qm_system_library(qm_metis libmetis-dev HEADER metis.h LIBS metis)
+qm_system_library(qm_openblas libopenblas-dev HEADER cblas.h LIBS openblas)

@@ -1,0 +1,57 @@
+#include "qm_solver/elementstiffness.h"
+
+#include "qm_solver/beamelement.h"
+
+namespace solver {
+
+namespace {
+
+void TrussMatrix(const T_FRAME& frame, const T_ELEMENT& element, T_MATRIX12& k)
+{
+    double length = 0.0;
+    const T_VEC3 e = TrussDirection(frame, element, length);
+    const double axial = TrussStiffness(frame, element, length);
+    k = {};
+    for (std::size_t r = 0; r < 3; ++r)
+        for (std::size_t c = 0; c < 3; ++c) {
+            const double value = axial * e[r] * e[c];
+            k[r][c] = k[6 + r][6 + c] = value;
+            k[r][6 + c] = k[6 + r][c] = -value;
+        }
+}
+
+} // namespace
+
+T_VEC3 TrussDirection(const T_FRAME& frame, const T_ELEMENT& element, double& length)
+{
+    const T_VEC3 along = Minus(frame.nodes[element.j].xyz, frame.nodes[element.i].xyz);
+    length = Norm(along);
+    return Scaled(along, 1.0 / length);
+}
+
+double TrussStiffness(const T_FRAME& frame, const T_ELEMENT& element, double length)
+{
+    return frame.materials[element.material].E * frame.sections[element.section].A / length;
+}
+
+void ElementStiffness(const T_FRAME& frame, const T_ELEMENT& element, T_MATRIX12& stiffness)
+{
+    switch (element.kind) {
+    case ELEMENT_KIND::Beam:
+        CBeamElement(frame, element).Stiffness(stiffness);
+        break;
+    case ELEMENT_KIND::Truss:
+        TrussMatrix(frame, element, stiffness);
+        break;
+    case ELEMENT_KIND::Link:
+    case ELEMENT_KIND::Spring:
+        stiffness = {};
+        for (std::size_t d = 0; d < 6; ++d) {
+            stiffness[d][d] = stiffness[d + 6][d + 6] = element.stiffness[d];
+            stiffness[d][d + 6] = stiffness[d + 6][d] = -element.stiffness[d];
+        }
+        break;
+    }
+}
+
+} // namespace solver

@@ -1,0 +1,28 @@
+// Stiffness of an element of any kind over the displacements of its nodes.
+#pragma once
+
+#include "qm_solver/vec3.h"
+
+namespace solver {
+
+/// Displacements that an element acts on: 12 (node i, node j), of a spring the first 6.
+inline std::size_t ElementSize(const T_ELEMENT& element)
+{
+    return element.kind == ELEMENT_KIND::Spring ? 6 : 12;
+}
+/// Full index (6 node + direction) of displacement `local` of an element.
+inline std::size_t ElementIndex(const T_ELEMENT& element, std::size_t local)
+{
+    return local < 6 ? 6 * element.i + local : 6 * element.j + local - 6;
+}
+
+/// Direction of a truss from i to j, and its length.
+T_VEC3 TrussDirection(const T_FRAME& frame, const T_ELEMENT& element, double& length);
+/// Axial stiffness E A / L of a truss.
+double TrussStiffness(const T_FRAME& frame, const T_ELEMENT& element, double length);
+
+/// Global axes; of a spring the first six rows and columns. Links and springs have one spring per
+/// direction, without levers: a link of some length passes its shear without the moment.
+void ElementStiffness(const T_FRAME& frame, const T_ELEMENT& element, T_MATRIX12& stiffness);
+
+} // namespace solver

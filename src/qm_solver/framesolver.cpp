@@ -1,0 +1,163 @@
+#include "qm_solver/framesolver.h"
+
+#include "qm_base/textformat.h"
+#include "qm_solver/caseblock.h"
+#include "qm_solver/frameassembly.h"
+#include "qm_solver/frameextent.h"
+#include "qm_solver/mechanism.h"
+#include "qm_solver/modelcheck.h"
+#include "qm_solver/sparsefactor.h"
+#include "qm_solver/stabilitycheck.h"
+#include "qm_solver/symmetricproduct.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace solver {
+
+namespace {
+
+constexpr std::size_t kCaseBlock = 64; // right-hand sides solved together
+/// Forces out of balance over the largest load of the case beyond which a solution is refused:
+/// stiffness contrasts of 1e10 stay below, a motion that escaped the factorisation does not.
+constexpr double kBalance = 1e-5;
+
+T_SOLVER_ERROR Failed(std::string reason)
+{
+    T_SOLVER_ERROR error;
+    error.fault = SOLVER_FAULT::Failed;
+    error.reason = std::move(reason);
+    return error;
+}
+
+/// The largest force and the largest moment over the unknowns.
+std::array<double, 2> Largest(const CFrameDofs& dofs, std::span<const double> values)
+{
+    std::array<double, 2> largest{};
+    for (std::size_t q = 0; q < values.size(); ++q) {
+        double& of = largest[dofs.Owner(q) % 6 < 3 ? 0 : 1];
+        const double value = std::fabs(values[q]);
+        of = value <= of ? of : value; // a NaN comes through
+    }
+    return largest;
+}
+
+} // namespace
+
+struct CFrameSolver::T_STATE {
+    T_FRAME frame;
+    CFrameDofs dofs;
+    CFrameAssembly assembly;
+    CSparseFactor factor;
+    double extent = 1.0; // length that compares moments with forces
+
+    explicit T_STATE(const T_FRAME& model) : frame(model), dofs(frame), extent(Extent(frame)) {}
+    std::optional<T_SOLVER_ERROR> Factorise();
+    std::optional<T_SOLVER_ERROR> SolveBlock(std::span<const T_LOAD_CASE> cases, std::size_t first,
+                                             std::vector<T_RESULT>& out);
+    bool Balanced(std::span<const double> loads, std::span<const double> x) const;
+};
+
+std::optional<T_SOLVER_ERROR> CFrameSolver::T_STATE::Factorise()
+{
+    std::string reason;
+    if (!assembly.Prepare(frame, dofs, reason)) return Failed(reason);
+    assembly.Assemble(frame);
+    if (dofs.EquationCount() == 0) return {}; // everything is held
+    if (!factor.Analyse(assembly.Matrix(), dofs.Blocks(), reason)) return Failed(reason);
+    T_SOLVER_ERROR error;
+    if (!FactorStable(assembly.Matrix(), dofs, factor, error)) return error;
+    return {};
+}
+
+std::optional<T_SOLVER_ERROR> CFrameSolver::T_STATE::SolveBlock(std::span<const T_LOAD_CASE> cases,
+                                                                std::size_t first,
+                                                                std::vector<T_RESULT>& out)
+{
+    const CCaseBlock block(frame, dofs, cases);
+    const std::vector<double> loads = block.RightSides();
+    std::vector<double> x = loads;
+    std::string reason;
+    const std::size_t n = dofs.EquationCount();
+    if (n > 0 && !factor.Solve(x, cases.size(), reason)) return Failed(reason);
+    for (std::size_t c = 0; c < cases.size(); ++c)
+        if (!Balanced(std::span(loads).subspan(c * n, n), std::span(x).subspan(c * n, n))) {
+            T_SOLVER_ERROR error = Failed("the forces do not balance: the model is nearly unstable "
+                                          "or its stiffnesses differ too much");
+            error.loadCase = static_cast<long>(first + c);
+            return error;
+        }
+    block.Recover(x, out);
+    return {};
+}
+
+bool CFrameSolver::T_STATE::Balanced(std::span<const double> loads, std::span<const double> x) const
+{
+    std::vector<double> rest(loads.size());
+    AddProduct<double>(assembly.Matrix(), x, rest);
+    for (std::size_t q = 0; q < rest.size(); ++q)
+        rest[q] -= loads[q];
+    const std::array<double, 2> load = Largest(dofs, loads), off = Largest(dofs, rest);
+    const double force = std::max(load[0], load[1] / extent);
+    return off[0] <= kBalance * force && off[1] <= kBalance * force * extent;
+}
+
+CFrameSolver::CFrameSolver() = default;
+CFrameSolver::~CFrameSolver() = default;
+CFrameSolver::CFrameSolver(CFrameSolver&&) noexcept = default;
+CFrameSolver& CFrameSolver::operator=(CFrameSolver&&) noexcept = default;
+
+int CFrameSolver::Prepare(const T_FRAME& frame, T_SOLVER_ERROR& error)
+{
+    m_state.reset();
+    std::optional<T_SOLVER_ERROR> fault = CheckModel(frame);
+    if (!fault) fault = CheckRigidBodies(frame);
+    std::unique_ptr<T_STATE> state;
+    if (!fault) {
+        state = std::make_unique<T_STATE>(frame);
+        fault = state->Factorise();
+    }
+    if (fault) {
+        error = *fault;
+        return 0;
+    }
+    m_state = std::move(state);
+    return 1;
+}
+
+int CFrameSolver::Solve(std::span<const T_LOAD_CASE> cases, std::vector<T_RESULT>& out,
+                        T_SOLVER_ERROR& error, const ProgressFn& progress)
+{
+    out.clear();
+    std::optional<T_SOLVER_ERROR> fault;
+    if (!m_state) fault = Failed("no model is prepared");
+    for (std::size_t c = 0; c < cases.size() && !fault; ++c)
+        fault = CheckCase(m_state->frame, m_state->dofs, cases[c], c);
+    std::vector<T_RESULT> results;
+    results.reserve(cases.size());
+    for (std::size_t first = 0; first < cases.size() && !fault; first += kCaseBlock) {
+        const std::size_t count = std::min(kCaseBlock, cases.size() - first);
+        fault = m_state->SolveBlock(cases.subspan(first, count), first, results);
+        if (!fault && progress && !progress(first + count, cases.size())) {
+            fault.emplace();
+            fault->fault = SOLVER_FAULT::Cancelled;
+            fault->reason = "cancelled";
+        }
+    }
+    if (fault) {
+        error = *fault;
+        return 0;
+    }
+    out = std::move(results);
+    return 1;
+}
+
+int CFrameSolver::Modes(std::size_t, std::vector<T_MODE>& out, T_SOLVER_ERROR& error,
+                        const ProgressFn&)
+{
+    out.clear();
+    error = Failed("modes are not available");
+    return 0;
+}
+
+} // namespace solver

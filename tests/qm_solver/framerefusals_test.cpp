@@ -1,0 +1,278 @@
+// What the engine refuses, with the place that is at fault.
+#include "solved.h"
+
+#include <functional>
+#include <limits>
+
+namespace {
+
+using namespace sample;
+
+constexpr double kNan = std::numeric_limits<double>::quiet_NaN();
+constexpr double kInf = std::numeric_limits<double>::infinity();
+
+struct T_REFUSED_MODEL {
+    const char* label;
+    std::function<void(T_FRAME&)> spoil;
+    SOLVER_FAULT fault;
+    long node, element;
+    const char* reason; // part of it
+};
+
+/// Two columns and a beam, all clamped at the feet.
+T_FRAME Portal()
+{
+    T_FRAME frame = Empty();
+    for (T_VEC3 at : {T_VEC3{0, 0, 0}, {0, 0, 3}, {5, 0, 3}, {5, 0, 0}})
+        AddNode(frame, at);
+    FixAll(frame, 0);
+    FixAll(frame, 3);
+    for (std::size_t n = 0; n < 3; ++n)
+        Join(frame, ELEMENT_KIND::Beam, n, n + 1);
+    return frame;
+}
+
+constexpr auto kBad = SOLVER_FAULT::BadModel;
+constexpr auto kFree = SOLVER_FAULT::Mechanism;
+
+const T_REFUSED_MODEL kModels[] = {
+    {"nothing", [](T_FRAME& f) { f = {}; }, kBad, -1, -1, "no nodes"},
+    {"coordinate", [](T_FRAME& f) { f.nodes[2].xyz[1] = kNan; }, kBad, 2, -1, "coordinate"},
+    {"mass", [](T_FRAME& f) { f.nodes[1].mass[0] = -1; }, kBad, 1, -1, "mass"},
+    {"gravity", [](T_FRAME& f) { f.gravity = kInf; }, kBad, -1, -1, "gravity"},
+    {"node", [](T_FRAME& f) { f.elements[1].j = 4; }, kBad, -1, 1, "node of it is missing"},
+    {"material", [](T_FRAME& f) { f.elements[1].material = 1; }, kBad, -1, 1, "material"},
+    {"section", [](T_FRAME& f) { f.elements[2].section = 7; }, kBad, -1, 2, "section"},
+    {"E", [](T_FRAME& f) { f.materials[0].E = 0; }, kBad, -1, 0, "modulus E"},
+    {"G", [](T_FRAME& f) { f.materials[0].G = 0; }, kBad, -1, 0, "torsion"},
+    {"density", [](T_FRAME& f) { f.materials[0].density = kNan; }, kBad, -1, 0, "density"},
+    {"expansion", [](T_FRAME& f) { f.materials[0].alpha = kInf; }, kBad, -1, 0, "expansion"},
+    {"area", [](T_FRAME& f) { f.sections[0].A = -1; }, kBad, -1, 0, "area A"},
+    {"shear area", [](T_FRAME& f) { f.sections[0].Asz = -1; }, kBad, -1, 0, "shear area"},
+    {"inertia", [](T_FRAME& f) { f.sections[0].Iz = -1; }, kBad, -1, 0, "second moment"},
+    {"one node", [](T_FRAME& f) { f.elements[0].j = 0; }, kBad, -1, 0, "same node"},
+    {"length",
+     [](T_FRAME& f) {
+         f.nodes[1].xyz = {0, 0, 0};
+     },
+     kBad, -1, 0, "zero length"},
+    {"offset takes the length",
+     [](T_FRAME& f) {
+         f.elements[1].offsetI = {5, 0, 0};
+     },
+     kBad, -1, 1, "zero length"},
+    {"reference",
+     [](T_FRAME& f) {
+         f.elements[1].zAxis = {2, 0, 0};
+     },
+     kBad, -1, 1, "parallel"},
+    {"offset",
+     [](T_FRAME& f) {
+         f.elements[1].offsetJ = {kNan, 0, 0};
+     },
+     kBad, -1, 1, "finite"},
+    {"offset of a truss",
+     [](T_FRAME& f) {
+         Join(f, ELEMENT_KIND::Truss, 0, 2);
+         f.elements[3].offsetI = {1, 0, 0};
+     },
+     kBad, -1, 3, "belong to beams"},
+    {"link",
+     [](T_FRAME& f) {
+         Join(f, ELEMENT_KIND::Link, 0, 2, {1, -1, 0, 0, 0, 0});
+     },
+     kBad, -1, 3, "stiffness is negative"},
+    {"spring", [](T_FRAME& f) { Join(f, ELEMENT_KIND::Spring, 1, 0); }, kBad, -1, 3, "are 0"},
+    {"twice", [](T_FRAME& f) { Join(f, ELEMENT_KIND::Beam, 2, 1); }, kBad, -1, 3,
+     "another element"},
+    {"diaphragm",
+     [](T_FRAME& f) {
+         f.diaphragms.push_back({{1, 4}, 2});
+     },
+     kBad, -1, -1, "diaphragm"},
+    {"normal",
+     [](T_FRAME& f) {
+         f.diaphragms.push_back({{1, 2}, 3});
+     },
+     kBad, -1, -1, "normal"},
+    {"equal",
+     [](T_FRAME& f) {
+         f.equalDisplacements.push_back({{9}, {}});
+     },
+     kBad, -1, -1, "equal"},
+    {"torsion released twice",
+     [](T_FRAME& f) { f.elements[1].releaseI[3] = f.elements[1].releaseJ[3] = true; }, kFree, -1, 1,
+     "about local x"},
+    {"shear released twice",
+     [](T_FRAME& f) { f.elements[1].releaseI[2] = f.elements[1].releaseJ[2] = true; }, kFree, -1, 1,
+     "along local z"},
+    {"free foot", [](T_FRAME& f) { f.nodes[0].fixed = f.nodes[3].fixed = {}; }, kFree, -1, -1,
+     "free to"},
+    {"released end at a loose node",
+     [](T_FRAME& f) {
+         Fix(f, AddNode(f, {9, 0, 3}), {0, 1, 2, 3, 5});
+         Join(f, ELEMENT_KIND::Beam, 2, 4);
+         f.elements[3].releaseJ[4] = true;
+     },
+     kFree, 4, -1, ""},
+};
+
+TEST(FrameRefusals, RefusesModelsAndNamesThePlace)
+{
+    for (const T_REFUSED_MODEL& c : kModels) {
+        SCOPED_TRACE(c.label);
+        T_FRAME frame = Portal();
+        c.spoil(frame);
+        CFrameSolver frameSolver;
+        T_SOLVER_ERROR error;
+        EXPECT_FALSE(frameSolver.Prepare(frame, error));
+        EXPECT_EQ(c.fault, error.fault);
+        EXPECT_EQ(c.element, error.element);
+        if (c.fault == kBad || c.node >= 0) {
+            EXPECT_EQ(c.node, error.node);
+        }
+        EXPECT_NE(std::string::npos, error.reason.find(c.reason)) << error.reason;
+        std::vector<T_RESULT> out;
+        EXPECT_FALSE(frameSolver.Solve(std::vector<T_LOAD_CASE>(1), out, error));
+    }
+}
+
+struct T_REFUSED_CASE {
+    const char* label;
+    std::function<void(T_LOAD_CASE&)> spoil;
+    long node, element;
+    const char* reason;
+};
+
+constexpr auto kPoint = BEAM_LOAD::Point;
+constexpr auto kLine = BEAM_LOAD::Distributed;
+
+// The portal with a truss (3) between nodes 0 and 2, a link (4) 1 - 2, a truss (5) up to the
+// pinned node 4, and a lone node 5.
+const T_REFUSED_CASE kCases[] = {
+    {"missing node",
+     [](auto& c) {
+         c.nodal.push_back({6, {}});
+     },
+     6, -1, "missing node"},
+    {"not a number",
+     [](auto& c) {
+         c.nodal.push_back({1, {kNan}});
+     },
+     1, -1, "finite"},
+    {"weight", [](auto& c) { c.selfWeight[1] = kInf; }, -1, -1, "finite"},
+    {"lone node",
+     [](auto& c) {
+         c.nodal.push_back({5, {0, 0, 1, 0, 0, 0}});
+     },
+     5, -1, "in Z"},
+    {"moment on trusses",
+     [](auto& c) {
+         c.nodal.push_back({4, {0, 0, 0, 0, 1, 0}});
+     },
+     4, -1, "in RY"},
+    {"missing element", [](auto& c) { c.beam.push_back({6}); }, -1, 6, "missing element"},
+    {"link", [](auto& c) { c.beam.push_back({4}); }, -1, 4, "link"},
+    {"direction",
+     [](auto& c) {
+         c.beam.push_back({0, kPoint, true, 3});
+     },
+     -1, 0, "direction"},
+    {"value",
+     [](auto& c) {
+         c.beam.push_back({0, kPoint, true, 1, {kNan, 0}});
+     },
+     -1, 0, "finite"},
+    {"beyond J",
+     [](auto& c) {
+         c.beam.push_back({0, kPoint, true, 1, {1, 0}, {1.1, 2}});
+     },
+     -1, 0, "outside"},
+    {"before I",
+     [](auto& c) {
+         c.beam.push_back({0, kLine, true, 1, {1, 0}, {-0.1, 1}});
+     },
+     -1, 0, "outside"},
+    {"backwards",
+     [](auto& c) {
+         c.beam.push_back({0, kLine, true, 1, {1, 0}, {0.5, 0.5}});
+     },
+     -1, 0, "ends where"},
+    {"truss, local",
+     [](auto& c) {
+         c.beam.push_back({3, kPoint, true, 1});
+     },
+     -1, 3, "local"},
+    {"truss, moment",
+     [](auto& c) {
+         c.beam.push_back({3, BEAM_LOAD::Moment, false, 1});
+     },
+     -1, 3, "moment"},
+    {"warm link",
+     [](auto& c) {
+         c.temperature.push_back({4, 1});
+     },
+     -1, 4, "temperature"},
+    {"warmth",
+     [](auto& c) {
+         c.temperature.push_back({0, kNan});
+     },
+     -1, 0, "finite"},
+    {"tension",
+     [](auto& c) {
+         c.pretension.push_back({9, 1});
+     },
+     -1, 9, "missing element"},
+    {"settlement, node",
+     [](auto& c) {
+         c.settlement.push_back({6, {}});
+     },
+     6, -1, "missing"},
+    {"settlement, number",
+     [](auto& c) {
+         c.settlement.push_back({0, {kInf}});
+     },
+     0, -1, "finite"},
+    {"settlement, free",
+     [](auto& c) {
+         c.settlement.push_back({1, {0, 1}});
+     },
+     1, -1, "in Y, which is not restrained"},
+    {"settlement against equal displacements",
+     [](auto& c) {
+         c.settlement.push_back({0, {0, 0.01}});
+     },
+     3, -1, "forbid"},
+};
+
+TEST(FrameRefusals, RefusesLoadsAndNamesThePlace)
+{
+    T_FRAME frame = Portal();
+    frame.equalDisplacements.push_back({{0, 3}, {false, true, false, false, false, false}});
+    Join(frame, ELEMENT_KIND::Truss, 0, 2);
+    Join(frame, ELEMENT_KIND::Link, 1, 2, {1, 1, 1, 0, 0, 0});
+    Fix(frame, AddNode(frame, {5, 0, 9}), {0, 1, 2});
+    Join(frame, ELEMENT_KIND::Truss, 2, 4);
+    AddNode(frame, {9, 9, 9});
+    CFrameSolver frameSolver;
+    T_SOLVER_ERROR error;
+    ASSERT_TRUE(frameSolver.Prepare(frame, error)) << error.reason;
+    for (const T_REFUSED_CASE& c : kCases) {
+        SCOPED_TRACE(c.label);
+        std::vector<T_LOAD_CASE> cases(2);
+        c.spoil(cases[1]);
+        std::vector<T_RESULT> out(1);
+        error = {};
+        EXPECT_FALSE(frameSolver.Solve(cases, out, error));
+        EXPECT_TRUE(out.empty());
+        EXPECT_EQ(kBad, error.fault);
+        EXPECT_EQ(1, error.loadCase);
+        EXPECT_EQ(c.node, error.node);
+        EXPECT_EQ(c.element, error.element);
+        EXPECT_NE(std::string::npos, error.reason.find(c.reason)) << error.reason;
+    }
+    std::vector<T_RESULT> out;
+    EXPECT_TRUE(frameSolver.Solve(std::vector<T_LOAD_CASE>(1), out, error)) << "still usable";
+}
+
+} // namespace
