@@ -4,6 +4,7 @@
 #include "qm_solver/balance.h"
 #include "qm_solver/beamelement.h"
 #include "qm_solver/cablesag.h"
+#include "qm_solver/fixedpoint.h"
 
 #include <algorithm>
 #include <cmath>
@@ -15,7 +16,7 @@ namespace {
 
 constexpr std::size_t kCaseBlock = 64; // right-hand sides solved together
 constexpr std::size_t kMaxIterations = 50;
-constexpr double kConverged = 1e-12; // change of the displacements over the largest
+constexpr double kConverged = 1e-12; // change of displacements and tensions over the largest
 constexpr double kRounding = 1e-9;   // below this a change that no longer shrinks is rounding
 
 T_SOLVER_ERROR Fault(SOLVER_FAULT fault, std::string reason)
@@ -26,7 +27,7 @@ T_SOLVER_ERROR Fault(SOLVER_FAULT fault, std::string reason)
     return error;
 }
 
-/// Largest change over the largest displacement, rotations times the size of the model.
+/// Largest change over the largest value, rotations times the size of the model.
 double Change(std::span<const double> now, std::span<const double> before, double size)
 {
     double change = 0.0, largest = 0.0;
@@ -247,6 +248,7 @@ int CStagedRun::Read(std::size_t stage, int step, const T_MIX& mix, T_RESULT& ou
 
 // ---- second order -------------------------------------------------------------------------------
 
+/// The tensions that a step begins with come from the step before; they are no iterate's result.
 CStagedRun::T_FAULT CStagedRun::Iterate()
 {
     CStagePart& part = Part();
@@ -254,6 +256,7 @@ CStagedRun::T_FAULT CStagedRun::Iterate()
     const T_MIX everything = Everything();
     const std::vector<std::size_t> cases = Moving();
     const std::size_t full = part.Dofs().FullCount();
+    CFixedPoint tensions;
     T_FIELD before(full, 0.0);
     double last = std::numeric_limits<double>::infinity();
     for (std::size_t it = 1; it <= kMaxIterations; ++it) {
@@ -263,19 +266,19 @@ CStagedRun::T_FAULT CStagedRun::Iterate()
         if (T_FAULT fault = part.Factorise(m_now.axial, it == 1)) return fault;
         if (T_FAULT fault = SolveCases(cases)) return fault;
         const T_FIELD now = CStageRecords::Sum(m_now, everything, full);
+        const std::vector<double> given = m_tension;
         ReadTensions(now);
-        const double change = Change(now, before, part.Size());
-        const bool first = it == 1 && change > 0.0; // the state before is not an iterate
-        if (!first && (change <= kConverged || (change <= kRounding && change >= last)))
-            return CheckBuckling();
-        last = first ? last : change;
+        const double change =
+            std::max(Change(now, before, part.Size()), Change(m_tension, given, 1.0));
+        if (change <= kConverged || (change <= kRounding && change >= last)) return CheckBuckling();
+        m_tension = tensions.Next(given, m_tension);
+        last = change;
         before = now;
     }
-    return Fault(
-        SOLVER_FAULT::NotConverged,
-        FormatText("the axial forces did not converge in %zu iterations: the displacements "
-                   "still changed by %.3g of the largest",
-                   kMaxIterations, last));
+    return Fault(SOLVER_FAULT::NotConverged,
+                 FormatText("the axial forces did not converge in %zu iterations: they still "
+                            "changed by %.3g of the largest",
+                            kMaxIterations, last));
 }
 
 /// Unstable where the stiffness with its axial forces has a negative eigenvalue.

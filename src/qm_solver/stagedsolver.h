@@ -36,9 +36,9 @@ struct T_STAGED_COST {
 /// Der E-Modul von Seilen unter Beruecksichtigung des Durchhanges, Der Bauingenieur 40, 1965). It
 /// is taken over the whole stretch since birth, so that the force is N = T + E_eq A / L times
 /// stretch, T the initial tension (and temperature): near N = T it is exact, away from it the
-/// stretch is that of the tangent. At least 1e-3 E; without tension this least. N by fixed-point
-/// iteration in each step until the displacements change by 1e-12 of the largest (or by no less
-/// than before, below 1e-9: rounding); at most 50, else NotConverged.
+/// stretch is that of the tangent. At least 1e-3 E; without tension this least. N by accelerated
+/// fixed-point iteration in each step until displacements and N change by 1e-12 of the largest (or
+/// by no less than before, below 1e-9: rounding); at most 50, else NotConverged.
 class CStagedSolver {
 public:
     CStagedSolver();
