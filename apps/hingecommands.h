@@ -12,6 +12,7 @@ struct T_HINGE_OPTIONS {
     std::string component;                   // "Fx" to "Mz"
     std::string end;                         // "I" or "J"; empty: the first page
     std::string to;                          // "ddy" or "plastic"
+    std::string elements;                    // "1,2,5-9"
     std::string out;                         // file to write: .json, .qmdb or a picture
     bool interaction = false;                // plot: interaction instead of the backbone
     std::vector<double> add, remove, change; // axial forces; change: old and new
@@ -23,6 +24,10 @@ EXIT_CODE RunHingeShow(const T_HINGE_OPTIONS& options);
 EXIT_CODE RunHingeCheck(const T_HINGE_OPTIONS& options);
 /// Yield strengths, rotations and deformations from section, material and member length.
 EXIT_CODE RunHingeYield(const T_HINGE_OPTIONS& options);
+/// Hinges of the type for the elements, as one edit; BadInput with the first element that can't.
+EXIT_CODE RunHingeAssign(const T_HINGE_OPTIONS& options);
+/// The generated hinges with their strengths per component and sign.
+EXIT_CODE RunHingeGenerated(const T_HINGE_OPTIONS& options);
 EXIT_CODE RunHingeConvert(const T_HINGE_OPTIONS& options);
 EXIT_CODE RunHingeAxial(const T_HINGE_OPTIONS& options);
 EXIT_CODE RunHingePlot(const T_HINGE_OPTIONS& options);

@@ -109,7 +109,7 @@ CLI::App* AddHinge(CLI::App* hinge, const char* name, const char* what, const ch
 void AddHingeCommands(CLI::App& app, EXIT_CODE& code)
 {
     auto* hinge = app.add_subcommand("hinge", "Plastic hinge types: list, show, check, yield, "
-                                              "convert, axial, plot");
+                                              "assign, generated, convert, axial, plot");
     hinge->require_subcommand(1);
     hinge->footer("Example:\n  qm-rps hinge check examples/hinge-library/case.json");
     const auto o = std::make_shared<T_HINGE_OPTIONS>();
@@ -123,6 +123,14 @@ void AddHingeCommands(CLI::App& app, EXIT_CODE& code)
     type(AddHinge(hinge, "yield", "Yield strengths and deformations from section and material", "",
                   o, RunHingeYield, code),
          false);
+    auto* assign =
+        AddHinge(hinge, "assign", "Give elements hinges of a type",
+                 " --type \"steel beam\" --elements 2,3 -o assigned.json", o, RunHingeAssign, code);
+    type(assign, true);
+    assign->add_option("--elements", o->elements, "Element ids: 1,2,5-9")->required();
+    assign->add_option("-o", o->out, "File to write: .qmdb or case file")->required();
+    AddHinge(hinge, "generated", "List the hinges of elements with their strengths", "", o,
+             RunHingeGenerated, code);
     auto* convert =
         AddHinge(hinge, "convert", "Switch FEMA curves between D/Dy and plastic",
                  " --type \"steel beam\" --to plastic -o plastic.json", o, RunHingeConvert, code);

@@ -5,7 +5,7 @@ if(QM_UI)
   list(APPEND rooms qm_ui)
 endif()
 # Headers that only the sources of their own room include are not public.
-set(internal "qm_db/(json|case[a-z]+[.]h|sqlite|recordcodec|recordbody|modelschema|modelreader|resultblock|recorderfile|checksum|filehandle|modellock|modeltemp|storefault|hingefields|hingenames)")
+set(internal "qm_db/(json|case[a-z]+[.]h|sqlite|recordcodec|recordbody|modelschema|modelreader|resultblock|recorderfile|checksum|filehandle|modellock|modeltemp|storefault|hingefields|hingenames|structfields|structnames|loadfields|staticblocks)")
 foreach(room ${rooms})
   file(GLOB headers RELATIVE ${PROJECT_SOURCE_DIR}/src ${PROJECT_SOURCE_DIR}/src/${room}/*.h)
   foreach(header ${headers})

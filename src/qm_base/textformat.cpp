@@ -1,34 +1,12 @@
 #include "qm_base/textformat.h"
 
+#include "qm_base/neutrallocale.h"
+
 #include <algorithm>
 #include <array>
 #include <charconv>
-#include <clocale>
 #include <cmath>
 #include <cstdio>
-#include <locale.h>
-
-namespace {
-
-/// Puts this thread into the "C" locale while it lives; other threads are not touched.
-class CNeutralLocale {
-public:
-    CNeutralLocale() : m_before(uselocale(Neutral())) {}
-    CNeutralLocale(const CNeutralLocale&) = delete;
-    CNeutralLocale& operator=(const CNeutralLocale&) = delete;
-    ~CNeutralLocale() { uselocale(m_before); }
-
-private:
-    static locale_t Neutral()
-    {
-        static const locale_t neutral = newlocale(LC_ALL_MASK, "C", nullptr);
-        return neutral;
-    }
-
-    locale_t m_before;
-};
-
-} // namespace
 
 std::string FormatText(const char* fmt, ...)
 {

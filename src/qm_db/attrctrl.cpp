@@ -1,5 +1,6 @@
 #include "qm_db/attrctrl.h"
 
+#include "qm_db/lcomflatten.h"
 #include "qm_db/recordunits.h"
 
 #include <set>
@@ -114,6 +115,70 @@ int CAttrCtrl::GetPofc(int key, T_POFC_D& out) const
     return Get(m_data.Model().incrementFunctions, key, m_data.Units(), out);
 }
 
+int CAttrCtrl::GetDiap(int key, T_DIAP_D& out) const
+{
+    return Get(m_data.Model().diaphragms, key, m_data.Units(), out);
+}
+
+int CAttrCtrl::GetEqds(int key, T_EQDS_D& out) const
+{
+    return Get(m_data.Model().equalDisplacements, key, m_data.Units(), out);
+}
+
+int CAttrCtrl::GetStld(int key, T_STLD_D& out) const
+{
+    return Get(m_data.Model().loadCases, key, m_data.Units(), out);
+}
+
+int CAttrCtrl::GetLcom(int key, T_LCOM_D& out) const
+{
+    return Get(m_data.Model().combinations, key, m_data.Units(), out);
+}
+
+int CAttrCtrl::GetUlfc(int key, T_ULFC_D& out) const
+{
+    return Get(m_data.Model().ulfConstraints, key, m_data.Units(), out);
+}
+
+int CAttrCtrl::GetUlfi(int key, T_ULFI_D& out) const
+{
+    return Get(m_data.Model().ulfItems, key, m_data.Units(), out);
+}
+
+int CAttrCtrl::GetLcom_(std::string_view name, T_LCOM_D& out) const
+{
+    int key = 0;
+    return FindLcom(name, key) && GetLcom(key, out);
+}
+
+int CAttrCtrl::GetUlfc_(std::string_view name, T_ULFC_D& out) const
+{
+    int key = 0;
+    return FindUlfc(name, key) && GetUlfc(key, out);
+}
+
+bool CAttrCtrl::ExistLcom(std::string_view name) const
+{
+    int key = 0;
+    return FindLcom(name, key) != 0;
+}
+
+int CAttrCtrl::GetLcomKey(std::string_view name, int& key) const
+{
+    return FindLcom(name, key);
+}
+
+int CAttrCtrl::NormalizeLcom(const T_LCOM_D& in, T_LCOM_D& out, std::string& error) const
+{
+    return FlattenLcom(m_data.Model(), in, out, error);
+}
+
+int CAttrCtrl::NormalizeLcom(const T_LCOM_D& in, T_LCOM_D& out) const
+{
+    std::string ignored;
+    return NormalizeLcom(in, out, ignored);
+}
+
 int CAttrCtrl::GetSectMatlByElem(int element, T_SECT_D& sect, T_MATL_D& matl) const
 {
     T_ELEM_D elem;
@@ -164,4 +229,24 @@ int CAttrCtrl::FindIehp(std::string_view name, int& key) const
 int CAttrCtrl::FindPofc(std::string_view name, int& key) const
 {
     return FindByName(m_data.Model().incrementFunctions, name, key);
+}
+
+int CAttrCtrl::FindStld(std::string_view name, int& key) const
+{
+    return FindByName(m_data.Model().loadCases, name, key);
+}
+
+int CAttrCtrl::FindLcom(std::string_view name, int& key) const
+{
+    return FindByName(m_data.Model().combinations, name, key);
+}
+
+int CAttrCtrl::FindUlfc(std::string_view name, int& key) const
+{
+    return FindByName(m_data.Model().ulfConstraints, name, key);
+}
+
+int CAttrCtrl::FindUlfi(std::string_view name, int& key) const
+{
+    return FindByName(m_data.Model().ulfItems, name, key);
 }

@@ -4,7 +4,9 @@
 #include "qm_db/datactrl.h"
 #include "qm_db/hingetype.h"
 
+#include <string>
 #include <string_view>
+#include <vector>
 
 /// Ids of the elements with a hinge of that type, ascending, each once.
 std::vector<int> ElementsWithHingeType(const T_MODEL& model, int hingeType);
@@ -28,6 +30,41 @@ public:
     [[nodiscard]] int GetPhge(int key, T_PHGE_D& out) const;
     [[nodiscard]] int GetIehp(int key, T_IEHP_D& out) const;
     [[nodiscard]] int GetPofc(int key, T_POFC_D& out) const;
+    [[nodiscard]] int GetDiap(int key, T_DIAP_D& out) const;
+    [[nodiscard]] int GetEqds(int key, T_EQDS_D& out) const;
+    [[nodiscard]] int GetStld(int key, T_STLD_D& out) const;
+    /// Combinations are read as they are stored: NormalizeLcom flattens them.
+    [[nodiscard]] int GetLcom(int key, T_LCOM_D& out) const;
+    [[nodiscard]] int GetUlfc(int key, T_ULFC_D& out) const;
+    [[nodiscard]] int GetUlfi(int key, T_ULFI_D& out) const;
+    /// The same by name.
+    [[nodiscard]] int GetLcom_(std::string_view name, T_LCOM_D& out) const;
+    [[nodiscard]] int GetUlfc_(std::string_view name, T_ULFC_D& out) const;
+
+    bool ExistLcom(std::string_view name) const;
+    /// Key of a general combination by name. 1 found; 0 not, output as it was.
+    [[nodiscard]] int GetLcomKey(std::string_view name, int& key) const;
+    /// The combination with its nested combinations replaced by their load cases: each case once,
+    /// in the order of first appearance, factors along the nesting multiplied and those of one case
+    /// summed. 1 done; 0 `error` says why (a case or combination is missing, a combination contains
+    /// itself, a factor is not finite), `out` as it was. In and out may be one object.
+    [[nodiscard]] int NormalizeLcom(const T_LCOM_D& in, T_LCOM_D& out, std::string& error) const;
+    [[nodiscard]] int NormalizeLcom(const T_LCOM_D& in, T_LCOM_D& out) const;
+
+    /// Keys in ascending order, which is that of definition; ids of nodes and elements.
+    template <class T>
+    std::vector<int> GetKeys() const
+    {
+        std::vector<int> keys;
+        for (const auto& entry : TableOf<T>(m_data.Model()))
+            keys.push_back(entry.first);
+        return keys;
+    }
+    std::vector<int> GetStldKeys() const { return GetKeys<T_STLD_D>(); }
+    std::vector<int> GetLcomKeys() const { return GetKeys<T_LCOM_D>(); }
+    std::vector<int> GetUlfcKeys() const { return GetKeys<T_ULFC_D>(); }
+    std::vector<int> GetUlfiKeys() const { return GetKeys<T_ULFI_D>(); }
+
     /// Section and material of an element. 0: no such element, or it lacks one of them; neither
     /// output is changed.
     [[nodiscard]] int GetSectMatlByElem(int element, T_SECT_D& sect, T_MATL_D& matl) const;
@@ -42,6 +79,10 @@ public:
     [[nodiscard]] int FindPhgt(std::string_view name, int& key) const;
     [[nodiscard]] int FindIehp(std::string_view name, int& key) const;
     [[nodiscard]] int FindPofc(std::string_view name, int& key) const;
+    [[nodiscard]] int FindStld(std::string_view name, int& key) const;
+    [[nodiscard]] int FindLcom(std::string_view name, int& key) const;
+    [[nodiscard]] int FindUlfc(std::string_view name, int& key) const;
+    [[nodiscard]] int FindUlfi(std::string_view name, int& key) const;
 
     /// A hinge type of one active FEMA component out of an inelastic hinge, and its I-end's curve
     /// back; component 0 to 5. See ConvertIehpToPhgtFema.

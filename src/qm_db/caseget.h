@@ -3,6 +3,7 @@
 
 #include "qm_db/hingefields.h"
 #include "qm_db/jsonreader.h"
+#include "qm_db/loadfields.h"
 
 #include <cmath>
 #include <type_traits>
@@ -14,10 +15,11 @@ public:
     static constexpr bool kReads = true;
     static constexpr bool kWrites = false;
 
-    /// `more`: keys of the object that the record's fields do not have.
+    /// `more`: keys of the object that the record's fields do not have. `names`: of a case file;
+    /// without them (in the model file) references are keys and nothing is checked.
     CCaseGet(CJsonReader& in, const T_UNITS& units,
-             std::initializer_list<std::string_view> more = {})
-        : m_in(in), m_units(units), m_keys(more)
+             std::initializer_list<std::string_view> more = {}, const CCaseNames* names = nullptr)
+        : m_in(in), m_units(units), m_names(names), m_keys(more)
     {
     }
 
@@ -28,6 +30,15 @@ public:
     {
         CCaseGet get(in, units, more);
         CaseFields(get, r, context...);
+        get.Finish();
+    }
+    /// The same in a case file.
+    template <class R>
+    static void Record(CJsonReader& in, const T_UNITS& units, const CCaseNames& names,
+                       std::initializer_list<std::string_view> more, R& r)
+    {
+        CCaseGet get(in, units, more, &names);
+        CaseFields(get, r);
         get.Finish();
     }
     /// For a caller that calls the fields itself: judges the keys.
@@ -67,10 +78,112 @@ public:
         CJsonReader member = m_in.Member(key);
         Read(member, out, dim);
     }
-    template <class T>
-    void OptIf(const char* key, std::optional<T>& out)
+    /// Returns the key that is there, `key` when neither is.
+    const char* OptOr(const char* key, const char* old, double& out, double missing, T_DIM dim)
     {
-        if (Has(key)) m_in.Get(key, out.emplace());
+        const bool older = old && Has(old);
+        if (older && Has(key))
+            m_in.FailAt(key, std::string("the same as \"") + old + "\", which is there too");
+        Opt(older ? old : key, out, missing, dim);
+        return older ? old : key;
+    }
+    template <class T>
+    void OptIf(const char* key, std::optional<T>& out, T_DIM dim = kDimNone)
+    {
+        if (Has(key)) Need(key, out.emplace(), dim);
+    }
+    template <std::size_t N>
+    void NeedFixed(const char* key, std::array<double, N>& out, const std::array<T_DIM, N>& dims)
+    {
+        if (!Take(key)) return;
+        CJsonReader member = m_in.Member(key);
+        member.Read(out);
+        for (std::size_t i = 0; i < N && !member.Failed(); ++i)
+            Convert(member, out[i], SiFactor(m_units, dims[i]));
+    }
+    template <std::size_t N>
+    void OptFixed(const char* key, std::array<double, N>& out, const std::array<double, N>& missing,
+                  const std::array<T_DIM, N>& dims)
+    {
+        out = missing;
+        if (Has(key)) NeedFixed(key, out, dims);
+    }
+    template <std::size_t N>
+    void Flags(const char* key, std::array<bool, N>& out, const std::array<const char*, N>& names,
+               const char* what)
+    {
+        out = {};
+        if (!Has(key)) return;
+        m_in.Member(key).ForEachItem([&](CJsonReader& item, std::size_t) {
+            out[static_cast<std::size_t>(item.Choice(names, what))] = true;
+        });
+    }
+    void Texts(const char* key, std::vector<std::string>& out)
+    {
+        if (!Has(key)) return;
+        m_in.Member(key).ForEachItem(
+            [&](CJsonReader& item, std::size_t) { item.Read(out.emplace_back()); });
+    }
+    /// 0 when it is left out.
+    void OptRef(const char* key, int& out, CASE_REF kind)
+    {
+        out = 0;
+        if (Has(key)) NeedRef(key, out, kind);
+    }
+    void NeedRef(const char* key, int& out, CASE_REF kind)
+    {
+        if (!Take(key)) return;
+        CJsonReader member = m_in.Member(key);
+        const bool byKey = kind == CASE_REF::Material || kind == CASE_REF::Section;
+        if (!m_names || (byKey && !member.IsText())) {
+            member.Read(out);
+            if (m_names && out != 0 && !m_names->HasKey(kind, out)) FailRef(member, kind);
+            return;
+        }
+        std::string name;
+        member.Read(name);
+        const std::optional<int> found = m_names->KeyOf(kind, name);
+        if (!found) FailRef(member, kind);
+        out = found.value_or(0);
+    }
+    void Node(const char* key, int& id)
+    {
+        Need(key, id);
+        if (m_names) m_in.Check(key, m_names->HasNode(id), "there is no such node");
+    }
+    void Element(const char* key, int& id)
+    {
+        Need(key, id);
+        if (m_names) m_in.Check(key, m_names->HasElement(id), "there is no such element");
+    }
+    void NodeList(const char* key, std::vector<int>& ids)
+    {
+        Need(key, ids);
+        if (!m_names) return;
+        std::set<int> seen;
+        m_in.CheckEach(
+            key, ids, [&](int id) { return m_names->HasNode(id); }, "there is no such node");
+        m_in.CheckEach(
+            key, ids, [&](int id) { return seen.insert(id).second; }, "the node appears twice");
+    }
+    /// A fault of a case file unless `ok`; a member that is left out is not judged.
+    void Check(const char* key, bool ok, const char* reason)
+    {
+        if (m_names) m_in.Check(key, ok, reason);
+    }
+    template <class R, class F>
+    void CheckEach(const char* key, const R& values, F ok, const char* reason)
+    {
+        if (m_names && m_in.Has(key)) m_in.CheckEach(key, values, ok, reason);
+    }
+    /// A fault of the member, or of the whole object, in every file.
+    void Rule(const char* key, bool ok, const char* reason)
+    {
+        if (ok || (key && !m_in.Has(key))) return;
+        if (key)
+            m_in.FailAt(key, reason);
+        else
+            m_in.Fail(reason);
     }
     template <class E>
     void Enum(const char* key, E& out, std::span<const char* const> names, const char* what)
@@ -100,14 +213,14 @@ public:
     {
         if (!Has(key)) return;
         CJsonReader member = m_in.Member(key);
-        Record(member, m_units, {}, r, context...);
+        Nested(member, r, context...);
     }
     template <class R, class... C>
     void NeedPart(const char* key, R& r, const C&... context)
     {
         if (!Take(key)) return;
         CJsonReader member = m_in.Member(key);
-        Record(member, m_units, {}, r, context...);
+        Nested(member, r, context...);
     }
     template <class R, class... C>
     void PartIf(const char* key, std::optional<R>& r, const C&... context)
@@ -120,9 +233,8 @@ public:
     void List(const char* key, std::vector<R>& all, const C&... context)
     {
         if (!Has(key)) return;
-        m_in.Member(key).ForEachItem([&](CJsonReader& item, std::size_t) {
-            Record(item, m_units, {}, all.emplace_back(), context...);
-        });
+        m_in.Member(key).ForEachItem(
+            [&](CJsonReader& item, std::size_t) { Nested(item, all.emplace_back(), context...); });
     }
     /// Up to N numbers; the rest is 0.
     template <std::size_t N>
@@ -152,6 +264,18 @@ public:
     }
 
 private:
+    template <class R, class... C>
+    void Nested(CJsonReader& in, R& r, const C&... context)
+    {
+        CCaseGet get(in, m_units, {}, m_names);
+        CaseFields(get, r, context...);
+        get.Finish();
+    }
+    static void FailRef(CJsonReader& in, CASE_REF kind)
+    {
+        in.Fail(std::string("there is no such ") + kCaseRefNames[static_cast<std::size_t>(kind)]);
+    }
+
     /// A missing member becomes a fault at the end: a wrong spelling is told first.
     bool Take(const char* key)
     {
@@ -180,6 +304,7 @@ private:
 
     CJsonReader& m_in;
     const T_UNITS& m_units;
+    const CCaseNames* m_names; // null in the model file
     std::vector<std::string_view> m_keys;
     const char* m_missing = nullptr;
 };

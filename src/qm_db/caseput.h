@@ -3,7 +3,9 @@
 
 #include "qm_db/hingefields.h"
 #include "qm_db/jsonwriter.h"
+#include "qm_db/loadfields.h"
 
+#include <algorithm>
 #include <bit>
 #include <cstdint>
 #include <type_traits>
@@ -15,7 +17,11 @@ public:
     static constexpr bool kReads = false;
     static constexpr bool kWrites = true;
 
-    explicit CCasePut(CJsonWriter& out) : m_out(out) {}
+    /// `names`: of a case file; without them (in the model file) references are keys.
+    explicit CCasePut(CJsonWriter& out, const CCaseNames* names = nullptr)
+        : m_out(out), m_names(names)
+    {
+    }
 
     void Fail(const std::string& reason) { m_out.Fail(reason); }
 
@@ -24,7 +30,7 @@ public:
     {
         Begin(key);
         if constexpr (std::is_same_v<T, int> || std::is_same_v<T, bool> ||
-                      std::is_same_v<T, std::string> || std::is_same_v<T, std::array<int, 2>>)
+                      std::is_same_v<T, std::string> || std::is_same_v<T, std::vector<int>>)
             m_out.Value(value);
         else
             m_out.Value(value, dim);
@@ -34,10 +40,73 @@ public:
     {
         if (!Same(value, missing)) Need(key, value, dim);
     }
-    template <class T>
-    void OptIf(const char* key, const std::optional<T>& value)
+    const char* OptOr(const char* key, const char*, double value, double missing, T_DIM dim)
     {
-        if (value) Need(key, *value);
+        Opt(key, value, missing, dim);
+        return key;
+    }
+    template <class T>
+    void OptIf(const char* key, const std::optional<T>& value, T_DIM dim = kDimNone)
+    {
+        if (value) Need(key, *value, dim);
+    }
+    template <std::size_t N>
+    void NeedFixed(const char* key, const std::array<double, N>& values,
+                   const std::array<T_DIM, N>& dims)
+    {
+        Begin(key);
+        m_out.Value(std::span<const double>(values), std::span<const T_DIM>(dims));
+    }
+    template <std::size_t N>
+    void OptFixed(const char* key, const std::array<double, N>& values,
+                  const std::array<double, N>& missing, const std::array<T_DIM, N>& dims)
+    {
+        const auto same = [](double a, double b) { return Same(a, b); };
+        if (!std::equal(values.begin(), values.end(), missing.begin(), same))
+            NeedFixed(key, values, dims);
+    }
+    template <std::size_t N>
+    void Flags(const char* key, const std::array<bool, N>& flags,
+               const std::array<const char*, N>& names, const char*)
+    {
+        std::vector<std::string> set;
+        for (std::size_t i = 0; i < N; ++i) {
+            if (flags[i]) set.emplace_back(names[i]);
+        }
+        Texts(key, set);
+    }
+    void Texts(const char* key, const std::vector<std::string>& texts)
+    {
+        if (texts.empty()) return;
+        Begin(key);
+        m_out.Value(std::span<const std::string>(texts));
+    }
+    void OptRef(const char* key, int target, CASE_REF kind)
+    {
+        if (target != 0) NeedRef(key, target, kind);
+    }
+    void NeedRef(const char* key, int target, CASE_REF kind)
+    {
+        if (!m_names) return Need(key, target);
+        Begin(key);
+        const std::string* const name = m_names->NameOf(kind, target);
+        if (!name) return m_out.Fail("no name for the key " + std::to_string(target));
+        m_out.Value(std::string_view(*name));
+    }
+    void Node(const char* key, int id) { Need(key, id); }
+    void Element(const char* key, int id) { Need(key, id); }
+    void NodeList(const char* key, const std::vector<int>& ids) { Need(key, ids); }
+    template <class... A>
+    void Check(const A&...) const
+    {
+    }
+    template <class... A>
+    void CheckEach(const A&...) const
+    {
+    }
+    template <class... A>
+    void Rule(const A&...) const
+    {
     }
     template <class E>
     void Enum(const char* key, E value, std::span<const char* const> names, const char*)
@@ -86,7 +155,7 @@ public:
         m_out.BeginArray();
         for (const R& r : all) {
             m_out.BeginObject(IsSmall<R>());
-            CCasePut item(m_out);
+            CCasePut item(m_out, m_names);
             CaseFields(item, r, context...);
             m_out.EndObject();
         }
@@ -127,7 +196,10 @@ private:
     {
         return std::is_same_v<R, T_REBAR> || std::is_same_v<R, T_POLC_PATTERN> ||
                std::is_same_v<R, T_SKEL_POINT> || std::is_same_v<R, T_SECT_FACTORS> ||
-               std::is_same_v<R, T_SIDES<double>>;
+               std::is_same_v<R, T_SIDES<double>> || std::is_same_v<R, T_NODAL_LOAD> ||
+               std::is_same_v<R, T_BEAM_LOAD> || std::is_same_v<R, T_SETTLEMENT> ||
+               std::is_same_v<R, T_TEMPERATURE_LOAD> || std::is_same_v<R, T_PTNS_D> ||
+               std::is_same_v<R, T_LCOM_ITEM> || std::is_same_v<R, T_ULFI_UNKNOWN>;
     }
     static bool Same(double a, double b) // -0.0 is not 0.0
     {
@@ -169,6 +241,7 @@ private:
     }
 
     CJsonWriter& m_out;
+    const CCaseNames* m_names; // null in the model file
     struct T_PART {
         const char* key;
         bool oneLine;

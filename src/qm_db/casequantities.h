@@ -2,6 +2,7 @@
 #pragma once
 
 #include "qm_db/hingefields.h"
+#include "qm_db/loadfields.h"
 
 template <class F>
 class CCaseQuantities {
@@ -23,6 +24,69 @@ public:
     void Opt(const char* key, T& value, const T&, T_DIM dim = kDimNone)
     {
         Need(key, value, dim);
+    }
+    const char* OptOr(const char* key, const char*, double& value, double, T_DIM dim)
+    {
+        Need(key, value, dim);
+        return key;
+    }
+    template <class T>
+    void OptIf(const char* key, std::optional<T>& value, T_DIM dim = kDimNone)
+    {
+        if (value) Need(key, *value, dim);
+    }
+    template <std::size_t N>
+    void NeedFixed(const char* key, std::array<double, N>& values, const std::array<T_DIM, N>& dims)
+    {
+        for (std::size_t i = 0; i < N; ++i)
+            Need(key, values[i], dims[i]);
+    }
+    template <std::size_t N>
+    void OptFixed(const char* key, std::array<double, N>& values, const std::array<double, N>&,
+                  const std::array<T_DIM, N>& dims)
+    {
+        NeedFixed(key, values, dims);
+    }
+    // What holds no quantities.
+    template <class... A>
+    void Flags(const A&...) const
+    {
+    }
+    template <class... A>
+    void Texts(const A&...) const
+    {
+    }
+    template <class... A>
+    void OptRef(const A&...) const
+    {
+    }
+    template <class... A>
+    void NeedRef(const A&...) const
+    {
+    }
+    template <class... A>
+    void Node(const A&...) const
+    {
+    }
+    template <class... A>
+    void Element(const A&...) const
+    {
+    }
+    template <class... A>
+    void NodeList(const A&...) const
+    {
+    }
+    template <class... A>
+    void Check(const A&...) const
+    {
+    }
+    template <class... A>
+    void CheckEach(const A&...) const
+    {
+    }
+    template <class... A>
+    void Rule(const A&...) const
+    {
     }
     template <class E, class... A>
     void Enum(const char*, E&, const A&...)

@@ -11,7 +11,9 @@
 /// The whole document. `folder` is where relative paths of recorder files start.
 void ReadCase(CJsonReader& root, const std::string& folder, T_MODEL_CONTENT& content);
 
-/// Design codes, hinge options, and the tables from the materials to the inelastic hinges.
+/// Design codes, hinge options, and the tables from the materials to the unknown load factor items.
+void ReadStructTables(CJsonReader& root, T_MODEL& model);
+/// Increment functions, hinge types and hinges.
 void ReadHingeTables(CJsonReader& root, T_MODEL& model);
 void ReadSpectra(CJsonReader& root, T_MODEL& model);
 void ReadPushovers(CJsonReader& root, const std::string& folder, T_MODEL_CONTENT& content);

@@ -1,5 +1,6 @@
 #include "qm_db/casereader.h"
 #include "qm_db/jsonnames.h"
+#include "qm_db/structnames.h"
 
 namespace {
 
@@ -18,6 +19,8 @@ void ReadHead(CJsonReader& root, T_STYP_D& styp)
 
     root.Get("gravity", styp.gravity);
     root.CheckIf("gravity", styp.gravity, IsAboveZero, "gravity must be above 0");
+    if (root.Has("plane"))
+        styp.plane = static_cast<MODEL_PLANE>(root.Choice("plane", kPlaneNames, "plane"));
     RecordToSiChecked(root, styp, styp.units);
 }
 
@@ -78,9 +81,32 @@ void ReadMode(CJsonReader& in, std::size_t index, T_MODEL& model)
 void ReadCase(CJsonReader& root, const std::string& folder, T_MODEL_CONTENT& content)
 {
     T_MODEL& model = content.model;
-    root.Keys({"format", "title", "units", "gravity", "nodes", "storeys", "modes", "design_codes",
-               "hinge_options", "materials", "sections", "elements", "increment_functions",
-               "hinge_types", "hinges", "inelastic_hinges", "spectra", "pushover", "evaluations"});
+    root.Keys({"format",
+               "title",
+               "units",
+               "gravity",
+               "plane",
+               "nodes",
+               "storeys",
+               "modes",
+               "design_codes",
+               "hinge_options",
+               "materials",
+               "sections",
+               "elements",
+               "diaphragms",
+               "equal_displacements",
+               "load_cases",
+               "combinations",
+               "ulf_constraints",
+               "ulf_items",
+               "increment_functions",
+               "hinge_types",
+               "hinges",
+               "inelastic_hinges",
+               "spectra",
+               "pushover",
+               "evaluations"});
     ReadHead(root, model.styp);
     root.Member("nodes").ForEachItem(
         [&](CJsonReader& item, std::size_t) { ReadNode(item, model); });
@@ -90,6 +116,7 @@ void ReadCase(CJsonReader& root, const std::string& folder, T_MODEL_CONTENT& con
     });
     ForEachRecord(root, "modes",
                   [&](CJsonReader& item, std::size_t index) { ReadMode(item, index, model); });
+    ReadStructTables(root, model);
     ReadHingeTables(root, model);
     ReadSpectra(root, model);
     ReadPushovers(root, folder, content);

@@ -1,6 +1,7 @@
 #include "qm_db/casewriter.h"
 
 #include "qm_db/jsonnames.h"
+#include "qm_db/structnames.h"
 
 namespace {
 
@@ -14,6 +15,7 @@ void WriteHead(CJsonWriter& out, const T_STYP_D& styp)
     out.Member("length", NameOf(styp.units.length));
     out.EndObject();
     if (styp.gravity) out.Member("gravity", *styp.gravity, kDimAccel);
+    if (styp.plane) out.Member("plane", kPlaneNames[static_cast<std::size_t>(*styp.plane)]);
 }
 
 void WriteNodes(CJsonWriter& out, const T_MODEL& model)
@@ -85,6 +87,7 @@ void WriteCase(CJsonWriter& out, const T_MODEL_CONTENT& content)
     WriteNodes(out, content.model);
     WriteStoreys(out, content.model);
     WriteModes(out, content.model);
+    WriteStructTables(out, content.model);
     WriteHingeTables(out, content.model);
     WriteSpectra(out, content.model);
     WritePushovers(out, content);

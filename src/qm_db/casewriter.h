@@ -9,6 +9,7 @@
 void WriteCase(CJsonWriter& out, const T_MODEL_CONTENT& content);
 
 /// Its parts; each writes one member of the document, or nothing when its table is empty.
+void WriteStructTables(CJsonWriter& out, const T_MODEL& model);
 void WriteHingeTables(CJsonWriter& out, const T_MODEL& model);
 void WriteSpectra(CJsonWriter& out, const T_MODEL& model);
 void WritePushovers(CJsonWriter& out, const T_MODEL_CONTENT& content);

@@ -1,5 +1,9 @@
 #include "qm_db/datactrl.h"
 
+#include "qm_db/editdata.h"
+#include "qm_db/lcomflatten.h"
+
+#include <algorithm>
 #include <utility>
 
 void CDataCtrl::Assign(T_MODEL_CONTENT content)
@@ -14,6 +18,32 @@ void CDataCtrl::SetResult(int pushover, std::shared_ptr<IPushResult> result)
     m_content.results[pushover] = std::move(result);
     m_modified = true;
     ++m_revision;
+}
+
+void CDataCtrl::SetStaticResult(int loadCase, std::shared_ptr<IStaticResult> result)
+{
+    if (result)
+        m_content.staticResults[loadCase] = std::move(result);
+    else
+        m_content.staticResults.erase(loadCase);
+    m_modified = true;
+    ++m_revision;
+}
+
+int CDataCtrl::AddLcom(const T_LCOM_D& combination)
+{
+    const auto& table = Model().combinations;
+    const bool taken = std::ranges::any_of(
+        table, [&](const auto& entry) { return entry.second.name == combination.name; });
+    T_LCOM_D flat;
+    std::string ignored;
+    if (!m_editor || combination.name.empty() || taken ||
+        !FlattenLcom(Model(), combination, flat, ignored))
+        return 0;
+    const int key = table.empty() ? 1 : table.rbegin()->first + 1;
+    if (m_editor->IsOpen()) return m_editor->Put(key, combination);
+    return m_editor->Begin(combination.name) && m_editor->Put(key, combination) &&
+           m_editor->Commit();
 }
 
 T_MODEL& CDataCtrl::ModelForEdit()

@@ -34,6 +34,18 @@ template <>
 inline constexpr T_TABLE<T_IEHP_D> T_MODEL::*kTableOf<T_IEHP_D> = &T_MODEL::inelasticHinges;
 template <>
 inline constexpr T_TABLE<T_POFC_D> T_MODEL::*kTableOf<T_POFC_D> = &T_MODEL::incrementFunctions;
+template <>
+inline constexpr T_TABLE<T_DIAP_D> T_MODEL::*kTableOf<T_DIAP_D> = &T_MODEL::diaphragms;
+template <>
+inline constexpr T_TABLE<T_EQDS_D> T_MODEL::*kTableOf<T_EQDS_D> = &T_MODEL::equalDisplacements;
+template <>
+inline constexpr T_TABLE<T_STLD_D> T_MODEL::*kTableOf<T_STLD_D> = &T_MODEL::loadCases;
+template <>
+inline constexpr T_TABLE<T_LCOM_D> T_MODEL::*kTableOf<T_LCOM_D> = &T_MODEL::combinations;
+template <>
+inline constexpr T_TABLE<T_ULFC_D> T_MODEL::*kTableOf<T_ULFC_D> = &T_MODEL::ulfConstraints;
+template <>
+inline constexpr T_TABLE<T_ULFI_D> T_MODEL::*kTableOf<T_ULFI_D> = &T_MODEL::ulfItems;
 
 /// Table of a record type: nodes for T_NODE_D, and so on.
 template <class T>
@@ -47,6 +59,8 @@ const T_TABLE<T>& TableOf(const T_MODEL& model)
     return model.*kTableOf<T>;
 }
 
+class CEditData;
+
 class CDataCtrl {
 public:
     const T_MODEL& Model() const { return m_content.model; }
@@ -57,6 +71,16 @@ public:
     void Assign(T_MODEL_CONTENT content);
     /// Replaces or adds the results of one pushover load case.
     void SetResult(int pushover, std::shared_ptr<IPushResult> result);
+
+    /// The same for a static load case; null removes them.
+    void SetStaticResult(int loadCase, std::shared_ptr<IStaticResult> result);
+
+    /// Adds a general combination under the next key, as an edit: within the open step, else as a
+    /// step of its own that can be undone. Factors have no units. Non-zero added; 0 refused: the
+    /// name is empty or taken, or an item refers to nothing.
+    [[nodiscard]] int AddLcom(const T_LCOM_D& combination);
+    /// For CEditData only, which makes itself known.
+    void SetEditor(CEditData* editor) { m_editor = editor; }
 
     bool IsModified() const { return m_modified; }
     void SetModified(bool modified) { m_modified = modified; }
@@ -74,4 +98,5 @@ private:
     T_MODEL_CONTENT m_content;
     bool m_modified = false;
     long m_revision = 0;
+    CEditData* m_editor = nullptr;
 };

@@ -2,6 +2,7 @@
 #pragma once
 
 #include "qm_base/dynmodule.h"
+#include "qm_db/analysisrun.h"
 #include "qm_db/attrctrl.h"
 #include "qm_db/dblib.h"
 #include "qm_db/editdata.h"
@@ -43,6 +44,12 @@ public:
     [[nodiscard]] int SaveModel(T_FILE_ERROR& error);
     [[nodiscard]] int SaveModelAs(const std::string& path, T_FILE_ERROR& error);
     [[nodiscard]] int ExportCase(const std::string& path, T_FILE_ERROR& error) const;
+
+    /// Linear analysis of static load cases, and eigen modes: see CAnalysisRun::Run.
+    [[nodiscard]] int RunAnalysis(const T_ANALYSIS_OPTIONS& options, T_ANALYSIS_ERROR& error)
+    {
+        return CAnalysisRun(m_data, m_edit).Run(options, error);
+    }
 
     /// Path of the model or case file; empty for a new document.
     const std::string& Path() const { return m_path; }

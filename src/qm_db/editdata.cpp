@@ -1,6 +1,7 @@
 #include "qm_db/editdata.h"
 
 #include <ranges>
+#include <set>
 #include <utility>
 
 int CEditData::Begin(std::string title)
@@ -41,6 +42,24 @@ int CEditData::ErasePhgt(int key, std::vector<int>& users)
 {
     users = ElementsWithHingeType(m_data.Model(), key);
     return users.empty() ? Erase<T_PHGT_D>(key) : 0;
+}
+
+bool CEditData::ContainsItself(int key, const T_LCOM_D& record) const
+{
+    const auto& table = m_data.Model().combinations;
+    std::set<int> seen;
+    std::vector<const T_LCOM_D*> open{&record};
+    while (!open.empty()) {
+        const T_LCOM_D& at = *open.back();
+        open.pop_back();
+        for (const T_LCOM_ITEM& item : at.items) {
+            if (!item.combination) continue;
+            if (item.key == key) return true;
+            const auto it = table.find(item.key);
+            if (it != table.end() && seen.insert(item.key).second) open.push_back(&it->second);
+        }
+    }
+    return false;
 }
 
 int CEditData::Record(T_CHANGE_ANY change)

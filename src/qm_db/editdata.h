@@ -2,13 +2,20 @@
 #pragma once
 
 #include "qm_db/attrctrl.h"
-#include "qm_db/hingetype.h"
+#include "qm_db/recordfit.h"
 #include "qm_db/recordunits.h"
+#include "qm_db/recorduse.h"
 #include "qm_db/undoctrl.h"
 
 class CEditData {
 public:
-    CEditData(CDataCtrl& data, CUndoCtrl& undo) : m_data(data), m_undo(undo) {}
+    CEditData(CDataCtrl& data, CUndoCtrl& undo) : m_data(data), m_undo(undo)
+    {
+        data.SetEditor(this);
+    }
+    CEditData(const CEditData&) = delete;
+    CEditData& operator=(const CEditData&) = delete;
+    ~CEditData() { m_data.SetEditor(nullptr); }
 
     /// Starts a step. 1 started; 0 another one is open.
     [[nodiscard]] int Begin(std::string title);
@@ -19,25 +26,32 @@ public:
     bool IsOpen() const { return m_open; }
 
     /// Adds or replaces the record with that key; quantities in the document's current units.
-    /// Curves of a hinge type that are not of their component's type are replaced (FitCurves).
-    /// 1 done; 0 no step is open.
+    /// Members that the record does not use get their defaults (FitRecord). 1 done; 0 no step is
+    /// open, or the record is a combination that would contain itself.
     template <class T>
     [[nodiscard]] int Put(int key, T record)
     {
-        if constexpr (std::is_same_v<T, T_PHGT_D>) FitCurves(record);
+        FitRecord(record);
+        if constexpr (std::is_same_v<T, T_LCOM_D>) {
+            if (ContainsItself(key, record)) return 0;
+        }
         RecordToSi(record, m_data.Units());
         return Change<T>(key, std::make_shared<const T>(std::move(record)));
     }
-    /// Deletes the record. 1 done; 0 no step is open or there is no such record, or it is a hinge
-    /// type that hinges use.
+    /// Deletes the record. 1 done; 0 no step is open, there is no such record, or other records
+    /// refer to it: `users` then has them.
+    template <class T>
+    [[nodiscard]] int Erase(int key, T_RECORD_USERS& users)
+    {
+        users = UsersOf<T>(m_data.Model(), key);
+        if (!m_open || !users.empty() || !TableOf<T>(m_data.Model()).contains(key)) return 0;
+        return Change<T>(key, nullptr);
+    }
     template <class T>
     [[nodiscard]] int Erase(int key)
     {
-        if constexpr (std::is_same_v<T, T_PHGT_D>) {
-            if (!ElementsWithHingeType(m_data.Model(), key).empty()) return 0;
-        }
-        if (!m_open || !TableOf<T>(m_data.Model()).contains(key)) return 0;
-        return Change<T>(key, nullptr);
+        T_RECORD_USERS users;
+        return Erase<T>(key, users);
     }
     /// Deletes a hinge type. 1 done; 0 no step is open, there is no such type, or hinges use it:
     /// `users` then has the ids of their elements, ascending.
@@ -58,6 +72,7 @@ private:
         return Record(std::move(change));
     }
     int Record(T_CHANGE_ANY change);
+    bool ContainsItself(int key, const T_LCOM_D& record) const;
 
     CDataCtrl& m_data;
     CUndoCtrl& m_undo;

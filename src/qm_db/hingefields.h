@@ -1,19 +1,9 @@
-// Members of the records of hinges and of what they refer to: each is listed once, with its key in
-// the case file and its dimension, for reading (CCaseGet), writing (CCasePut) and for the list of
-// quantities (CCaseQuantities). Names of records and references by key stand outside.
-//
-// Need: a member that must be there. Opt: left out when it has the given default. Enum, EnumOpt: a
-// name out of a list. Code: the same, other numbers stay numbers. Part: a nested record, left out
-// when it has nothing to say. PartIf, List, Padded, Pairs: as their types say.
+// Members of the records of hinges and of pushover load cases; see structfields.h.
 #pragma once
 
 #include "qm_db/hingenames.h"
 #include "qm_db/hingetype.h"
-#include "qm_db/records.h"
-
-/// T& for a visitor that reads or converts, const T& for one that writes.
-template <class V, class T>
-using T_FIELD_REF = typename V::template Ref<T>;
+#include "qm_db/structfields.h"
 
 /// Dimensions of one curve.
 struct T_CURVE_DIMS {
@@ -24,76 +14,6 @@ struct T_CURVE_DIMS {
         return {strength.force - deform.force, strength.length - deform.length};
     }
 };
-
-inline constexpr T_DIM kDimArea{0, 2};
-inline constexpr T_DIM kDimModulus{0, 3};
-inline constexpr T_DIM kDimInertia{0, 4};
-
-// ---- materials, sections, elements --------------------------------------------------------------
-
-template <class V>
-void CaseFields(V& v, T_FIELD_REF<V, T_MATL_D> r)
-{
-    v.Enum("type", r.type, kMatlNames, "material type");
-    v.Opt("E", r.E, 0.0, kDimStress);
-    v.Opt("nu", r.nu, 0.0);
-    v.Opt("Fy", r.Fy, 0.0, kDimStress);
-    v.Opt("fck", r.fck, 0.0, kDimStress);
-    v.Opt("fyk", r.fyk, 0.0, kDimStress);
-    v.Opt("Es", r.Es, 0.0, kDimStress);
-}
-
-template <class V>
-void CaseFields(V& v, T_FIELD_REF<V, T_REBAR> r)
-{
-    v.Need("y", r.y, kDimLength);
-    v.Need("z", r.z, kDimLength);
-    v.Need("area", r.area, kDimArea);
-}
-
-template <class V>
-void CaseFields(V& v, T_FIELD_REF<V, T_SECT_FACTORS> r)
-{
-    v.Opt("area", r.area, 1.0);
-    v.Opt("Asy", r.Asy, 1.0);
-    v.Opt("Asz", r.Asz, 1.0);
-    v.Opt("J", r.J, 1.0);
-    v.Opt("Iyy", r.Iyy, 1.0);
-    v.Opt("Izz", r.Izz, 1.0);
-}
-
-template <class V>
-void CaseFields(V& v, T_FIELD_REF<V, T_SECT_D> r)
-{
-    v.Enum("shape", r.shape, kShapeNames, "shape");
-    v.Padded("size", r.size, kDimLength);
-    v.Opt("area", r.area, 0.0, kDimArea);
-    v.Opt("Asy", r.Asy, 0.0, kDimArea);
-    v.Opt("Asz", r.Asz, 0.0, kDimArea);
-    v.Opt("J", r.J, 0.0, kDimInertia);
-    v.Opt("Iyy", r.Iyy, 0.0, kDimInertia);
-    v.Opt("Izz", r.Izz, 0.0, kDimInertia);
-    v.Opt("Zy", r.Zy, 0.0, kDimModulus);
-    v.Opt("Zz", r.Zz, 0.0, kDimModulus);
-    v.Part("factors_I", r.factorsI);
-    v.Part("factors_J", r.factorsJ);
-    v.List("bars", r.bars);
-}
-
-template <class V>
-void CaseFields(V& v, T_FIELD_REF<V, T_ELEM_D> r)
-{
-    std::array<int, 2> nodes{r.nodeI, r.nodeJ};
-    v.Need("id", r.id);
-    v.Need("nodes", nodes);
-    v.Opt("section", r.section, 0);
-    v.Opt("material", r.material, 0);
-    v.Opt("member", r.member, 0);
-    if constexpr (V::kReads) {
-        r.nodeI = nodes[0];
-        r.nodeJ = nodes[1];
-    }
-}
 
 // ---- curves
 // ---------------------------------------------------------------------------------------
@@ -188,6 +108,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_SKEL_FEMA> r, const T_CURVE_DIMS& given)
     v.PartIf("dc_ratio", r.dcRatio, kDimNone);
     v.Opt("infill_strut", r.infillStrut, d.infillStrut);
     v.Opt("infill_general", r.infillGeneral, d.infillGeneral);
+    v.Opt("compliance_criteria", r.compliance, d.compliance);
 }
 
 template <class V>
@@ -366,6 +287,8 @@ void CaseFields(V& v, T_FIELD_REF<V, T_PHGT_D> r)
     v.EnumOpt("material", r.material, d.material, kMatlNames, "material type");
     v.Opt("section", r.section, 0);
     v.Opt("section_material", r.sectionMaterial, 0);
+    v.Opt("fibre_section", r.fibreSection, 0);
+    v.Opt("thickness_section", r.thicknessSection, 0);
     v.Part("components", r.components, r.definition);
     v.PartIf("yield_surface", r.yieldSurface);
     v.PartIf("pmm", r.pmm);

@@ -1,8 +1,9 @@
-// Records of plastic hinges: materials, sections, elements, hinge types, generated hinges.
+// Records of plastic hinges: hinge types, generated hinges.
 // Plain data; in the store every quantity is in SI. Signs are as entered: the negative side of a
 // FEMA or Eurocode curve holds negative numbers, the sides of a multilinear curve hold magnitudes.
 #pragma once
 
+#include "qm_db/structrecords.h"
 #include "qm_db/units.h"
 
 #include <array>
@@ -10,58 +11,6 @@
 #include <string>
 #include <variant>
 #include <vector>
-
-// ---- section and material ---------------------------------------------------------------------
-
-enum class MATL_CLASS { Concrete, Steel, Composite, Masonry };
-
-struct T_MATL_D {
-    std::string name;
-    MATL_CLASS type = MATL_CLASS::Steel;
-    double E = 0.0;   // elastic modulus
-    double nu = 0.0;  // Poisson's ratio
-    double Fy = 0.0;  // yield strength of steel
-    double fck = 0.0; // compressive strength of concrete or masonry
-    double fyk = 0.0; // yield strength of the bars of concrete
-    double Es = 0.0;  // elastic modulus of the bars
-    bool operator==(const T_MATL_D&) const = default;
-};
-
-enum class SECT_SHAPE { Value, Rectangle, Circle, Pipe, Box, IShape };
-
-/// A reinforcing bar in section coordinates, from the centroid.
-struct T_REBAR {
-    double y = 0.0, z = 0.0, area = 0.0;
-    bool operator==(const T_REBAR&) const = default;
-};
-
-/// Stiffness factors of a section at one end.
-struct T_SECT_FACTORS {
-    double area = 1.0, Asy = 1.0, Asz = 1.0, J = 1.0, Iyy = 1.0, Izz = 1.0;
-    bool operator==(const T_SECT_FACTORS&) const = default;
-};
-
-struct T_SECT_D {
-    std::string name;
-    SECT_SHAPE shape = SECT_SHAPE::Value;
-    /// Rectangle: height, width. Circle: diameter. Pipe: diameter, wall. Box: height, width, web,
-    /// flange. I: height, flange width, web, flange. Height is along z, width along y.
-    std::array<double, 4> size{};
-    double area = 0.0, Asy = 0.0, Asz = 0.0; // area, shear areas
-    double J = 0.0, Iyy = 0.0, Izz = 0.0;    // second moments
-    double Zy = 0.0, Zz = 0.0;               // plastic moduli
-    T_SECT_FACTORS factorsI, factorsJ;
-    std::vector<T_REBAR> bars; // concrete
-    bool operator==(const T_SECT_D&) const = default;
-};
-
-struct T_ELEM_D {
-    int id = 0;
-    int nodeI = 0, nodeJ = 0;
-    int section = 0, material = 0; // keys
-    int member = 0;                // elements of one member share the number; 0: alone
-    bool operator==(const T_ELEM_D&) const = default;
-};
 
 // ---- hinge type -------------------------------------------------------------------------------
 
@@ -88,11 +37,6 @@ template <class T>
 struct T_SIDES {
     T pos{}, neg{};
     bool operator==(const T_SIDES&) const = default;
-};
-template <class T>
-struct T_ENDS {
-    T I{}, J{};
-    bool operator==(const T_ENDS&) const = default;
 };
 
 /// A point of a FEMA or Eurocode curve: deformation in the curve's measure, strength / yield.
@@ -142,6 +86,7 @@ struct T_SKEL_FEMA {
     std::optional<T_SIDES<double>> dcRatio; // demand / capacity limits, [0, 1]
     bool infillStrut = false;
     bool infillGeneral = false; // general form, else plastic form
+    bool compliance = true;     // the acceptance criteria are in use
     bool operator==(const T_SKEL_FEMA&) const = default;
 };
 
@@ -253,6 +198,9 @@ struct T_PHGT_D {
     MATL_CLASS material = MATL_CLASS::Steel;
     std::array<T_HINGE_COMPONENT, 6> components; // by HINGE_COMPONENT
     int section = 0, sectionMaterial = 0;        // keys that automatic strengths read; 0: none
+    // Keys of sections; 0: none. The fibres of a frame are those of any section with dimensions and
+    // its bars, the fibres and the thickness of a wall those of a rectangle (its smaller side).
+    int fibreSection = 0, thicknessSection = 0;
     std::optional<T_YIELD_SURFACE> yieldSurface;
     std::optional<T_PMM_TABLE> pmm;
     T_HINGE_LENGTH length;

@@ -101,14 +101,13 @@ void CJsonReader::GetName(std::string_view key, std::string& out, std::set<std::
     if (!taken.insert(out).second) FailAt(key, QuotedText(out) + " appears twice");
 }
 
-int CJsonReader::Choice(std::string_view key, std::span<const char* const> names, const char* what)
+int CJsonReader::Choice(std::span<const char* const> names, const char* what)
 {
     std::string text;
-    Get(key, text);
+    Read(text);
     const auto it = std::find(names.begin(), names.end(), text);
     if (it != names.end()) return static_cast<int>(it - names.begin());
-    FailAt(key,
-           "unknown " + std::string(what) + ' ' + QuotedText(text) + "; allowed: " + Joined(names));
+    Fail("unknown " + std::string(what) + ' ' + QuotedText(text) + "; allowed: " + Joined(names));
     return 0;
 }
 

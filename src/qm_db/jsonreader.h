@@ -65,7 +65,12 @@ public:
     /// Reads a name (not empty, no control characters) that no other record of its table has.
     void GetName(std::string_view key, std::string& out, std::set<std::string>& taken);
     /// Reads a text out of a list and gives its index; `what` names it ("unit").
-    int Choice(std::string_view key, std::span<const char* const> names, const char* what);
+    int Choice(std::string_view key, std::span<const char* const> names, const char* what)
+    {
+        return Member(key).Choice(names, what);
+    }
+    /// The same for this value.
+    int Choice(std::span<const char* const> names, const char* what);
 
     void Read(double& out);
     void Read(int& out);

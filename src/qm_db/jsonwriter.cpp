@@ -95,14 +95,30 @@ void CJsonWriter::Value(std::string_view value)
 
 void CJsonWriter::Value(std::span<const double> values, T_DIM dim)
 {
+    Value(values, std::span<const T_DIM>(&dim, 1));
+}
+
+void CJsonWriter::Value(std::span<const double> values, std::span<const T_DIM> dims)
+{
     BeforeValue();
     std::string joined;
     for (std::size_t i = 0; i < values.size(); ++i) {
-        const auto text = SiText(values[i], m_units, dim);
+        const auto text = SiText(values[i], m_units, dims.size() == 1 ? dims[0] : dims[i]);
         if (!text) return Fail(ItemPlace("item ", i) + " is not a finite number");
         joined += i == 0 ? *text : ", " + *text;
     }
     AppendNumbers(joined);
+}
+
+void CJsonWriter::Value(std::span<const std::string> values)
+{
+    BeforeValue();
+    m_text += '[';
+    for (std::size_t i = 0; i < values.size(); ++i) {
+        if (i > 0) m_text += ", ";
+        AppendText(values[i]);
+    }
+    m_text += ']';
 }
 
 void CJsonWriter::Value(std::span<const int> values)

@@ -29,7 +29,10 @@ public:
     void Value(std::string_view value);
     void Value(const char* value) { Value(std::string_view(value)); }
     void Value(std::span<const double> values, T_DIM dim = kDimNone);
+    /// Each with its dimension, or all with the one that is given.
+    void Value(std::span<const double> values, std::span<const T_DIM> dims);
     void Value(std::span<const int> values);
+    void Value(std::span<const std::string> values);
 
     template <class T>
     void Member(std::string_view key, const T& value)

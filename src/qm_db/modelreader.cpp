@@ -9,6 +9,7 @@
 #include "qm_db/sqlitedb.h"
 #include "qm_db/sqlitestmt.h"
 #include "qm_db/sqlitetransaction.h"
+#include "qm_db/staticblocks.h"
 #include "qm_db/storefault.h"
 
 #include <algorithm>
@@ -149,14 +150,6 @@ CSqliteDb MigratedCopy(const CSqliteDb& db, int version, const T_SCHEMA& schema)
     return copy;
 }
 
-/// Model and result heads, with the sums of what was read.
-T_MODEL ReadRecords(const CSqliteDb& db, std::vector<T_RESULT_HEAD>& heads, T_TABLE_SUMS& sums)
-{
-    T_MODEL model = ReadModel(db, sums);
-    heads = ReadResultHeads(db, sums);
-    return model;
-}
-
 } // namespace
 
 T_MODEL_CONTENT ReadModelFile(const std::string& path, const T_SCHEMA& schema, CHECK_DEPTH depth)
@@ -173,9 +166,10 @@ T_MODEL_CONTENT ReadModelFile(const std::string& path, const T_SCHEMA& schema, C
         CheckSchema(*db);
 
     T_MODEL_CONTENT content;
-    std::vector<T_RESULT_HEAD> heads;
     T_TABLE_SUMS found;
-    content.model = ReadRecords(*db, heads, found);
+    content.model = ReadModel(*db, found);
+    const std::vector<T_RESULT_HEAD> heads = ReadResultHeads(*db, found);
+    const std::vector<T_STATIC_HEAD> staticHeads = ReadStaticHeads(*db, found);
     if (!older) {
         const T_TABLE_SUMS stored = ReadChecksums(*db);
         found[kSchemaTable] = SumOfTable(*db, kSchemaTable);
@@ -183,9 +177,14 @@ T_MODEL_CONTENT ReadModelFile(const std::string& path, const T_SCHEMA& schema, C
         for (const auto& [table, sum] : found)
             CompareSum(stored, table, sum);
     }
-    if (whole) CheckBlocks(*db, heads);
+    if (whole) {
+        CheckBlocks(*db, heads);
+        CheckStaticBlocks(*db, staticHeads);
+    }
     for (const T_RESULT_HEAD& head : heads)
         content.results[head.pushover] = std::make_shared<CBlockPushResult>(db, path, head);
+    for (const T_STATIC_HEAD& head : staticHeads)
+        content.staticResults[head.loadCase] = std::make_shared<CBlockStaticResult>(db, path, head);
     return content;
 }
 
@@ -211,6 +210,7 @@ void WriteModelFile(const std::string& path, const T_MODEL_CONTENT& content)
     CreateSchema(db);
     WriteModel(db, content.model);
     WriteResults(db, content.results);
+    WriteStaticResults(db, content.model, content.staticResults);
     WriteChecksums(db);
     transaction.Commit();
 }

@@ -6,6 +6,7 @@
 #include "qm_db/storefault.h"
 
 #include <algorithm>
+#include <vector>
 
 namespace {
 
@@ -27,6 +28,24 @@ constexpr const char* kIncrementFunctions =
     "CREATE TABLE increment_functions(key INTEGER PRIMARY KEY, name TEXT NOT NULL, "
     "negative_zeros INTEGER NOT NULL) STRICT";
 
+// Tables that came with version 3.
+constexpr const char* kVersion3[] = {
+    "CREATE TABLE diaphragms(key INTEGER PRIMARY KEY, body TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+    "CREATE TABLE equal_displacements(key INTEGER PRIMARY KEY, body TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+    "CREATE TABLE load_cases(key INTEGER PRIMARY KEY, name TEXT NOT NULL, body TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+    "CREATE TABLE combinations(key INTEGER PRIMARY KEY, name TEXT NOT NULL, body TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+    "CREATE TABLE ulf_constraints(key INTEGER PRIMARY KEY, name TEXT NOT NULL, "
+    "body TEXT NOT NULL, negative_zeros INTEGER NOT NULL) STRICT",
+    "CREATE TABLE ulf_items(key INTEGER PRIMARY KEY, name TEXT NOT NULL, body TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+    "CREATE TABLE static_results(key INTEGER PRIMARY KEY, nodes INTEGER NOT NULL, "
+    "elements INTEGER NOT NULL, fingerprint INTEGER NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT"};
+
 // Scalars are typed columns, quantities in SI. Bit i of negative_zeros says that the i-th column
 // of the row is -0.0: a REAL column stores a whole number as an integer, which has no such value.
 // Every list of numbers (node ids, coordinates, mode shapes, spectrum tables) is a row of "arrays":
@@ -36,7 +55,7 @@ constexpr const char* kTables[] = {
     "CREATE TABLE model(key INTEGER PRIMARY KEY, title TEXT NOT NULL, force_unit TEXT NOT NULL, "
     "length_unit TEXT NOT NULL, gravity REAL, negative_zeros INTEGER NOT NULL, "
     "concrete_code TEXT, steel_code TEXT, alternative_hysteresis INTEGER NOT NULL, "
-    "wall_strength_degradation INTEGER NOT NULL, gsd INTEGER NOT NULL) STRICT",
+    "wall_strength_degradation INTEGER NOT NULL, gsd INTEGER NOT NULL, plane INTEGER) STRICT",
 
     "CREATE TABLE storeys(key INTEGER PRIMARY KEY, name TEXT NOT NULL, height REAL NOT NULL, "
     "negative_zeros INTEGER NOT NULL) STRICT",
@@ -74,7 +93,10 @@ constexpr const char* kTables[] = {
     "nodes INTEGER NOT NULL, negative_zeros INTEGER NOT NULL) STRICT",
 
     // part: 0 load factors, 1 base reactions, 2 ids of 512 nodes, 3 displacements of 512 nodes in
-    // one step; chunk and step count from 0 and are 0 where they mean nothing.
+    // one step; of static results 4 ids of 512 nodes, 5 ids of 512 elements, 6 displacements and
+    // 7 reactions of the nodes, 8 forces of the elements. pushover is the key of the load case,
+    // of a static one from part 4 on. chunk and step count from 0 and are 0 where they mean
+    // nothing.
     "CREATE TABLE result_blocks(pushover INTEGER NOT NULL, part INTEGER NOT NULL, "
     "chunk INTEGER NOT NULL, step INTEGER NOT NULL, count INTEGER NOT NULL, "
     "width INTEGER NOT NULL, byte_order TEXT NOT NULL, checksum INTEGER NOT NULL, "
@@ -98,18 +120,33 @@ void MigrateFrom1(const CSqliteDb& db)
         db.Exec(sql);
 }
 
+/// Version 2 had neither loads nor static results, and beams without ends of their own.
+void MigrateFrom2(const CSqliteDb& db)
+{
+    db.Exec("ALTER TABLE model ADD COLUMN plane INTEGER");
+    for (const char* const sql : kVersion3)
+        db.Exec(sql);
+}
+
+std::vector<std::string> AllTables()
+{
+    std::vector<std::string> all(std::begin(kTables), std::end(kTables));
+    all.insert(all.end(), std::begin(kVersion3), std::end(kVersion3));
+    return all;
+}
+
 } // namespace
 
 const T_SCHEMA& CurrentSchema()
 {
-    static constexpr T_MIGRATION kMigrations[] = {{1, MigrateFrom1}};
-    static constexpr T_SCHEMA kSchema{2, kMigrations};
+    static constexpr T_MIGRATION kMigrations[] = {{1, MigrateFrom1}, {2, MigrateFrom2}};
+    static constexpr T_SCHEMA kSchema{3, kMigrations};
     return kSchema;
 }
 
 void CreateSchema(const CSqliteDb& db)
 {
-    for (const char* const sql : kTables)
+    for (const std::string& sql : AllTables())
         db.Exec(sql);
     db.Exec("PRAGMA application_id = " + std::to_string(kModelApplicationId));
     db.Exec("PRAGMA user_version = " + std::to_string(CurrentSchema().version));
@@ -118,14 +155,14 @@ void CreateSchema(const CSqliteDb& db)
 void CheckSchema(const CSqliteDb& db)
 {
     CSqliteStmt stmt(db, "SELECT type, sql FROM sqlite_schema ORDER BY rowid");
+    const std::vector<std::string> tables = AllTables();
     std::size_t count = 0;
     bool same = true;
     while (same && stmt.Step()) {
-        same =
-            count < std::size(kTables) && stmt.Text(0) == "table" && stmt.Text(1) == kTables[count];
+        same = count < tables.size() && stmt.Text(0) == "table" && stmt.Text(1) == tables[count];
         ++count;
     }
-    if (!same || count != std::size(kTables))
+    if (!same || count != tables.size())
         ThrowDamaged(zql::lib::MMSGFunction::GetValue("IDS_QM_DB_DAMAGE_SCHEMA"));
 }
 

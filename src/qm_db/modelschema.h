@@ -24,7 +24,7 @@ struct T_SCHEMA {
 
 /// Tables with a checksum of their own, in the order of writing. "sqlite_schema" (the text of the
 /// schema itself) is summed too; result_blocks is summed without the data, which have their own.
-inline constexpr std::array<const char*, 14> kModelTables{"model",
+inline constexpr std::array<const char*, 21> kModelTables{"model",
                                                           "storeys",
                                                           "modes",
                                                           "spectra",
@@ -37,7 +37,14 @@ inline constexpr std::array<const char*, 14> kModelTables{"model",
                                                           "arrays",
                                                           "results",
                                                           "inelastic_hinges",
-                                                          "increment_functions"};
+                                                          "increment_functions",
+                                                          "diaphragms",
+                                                          "equal_displacements",
+                                                          "load_cases",
+                                                          "combinations",
+                                                          "ulf_constraints",
+                                                          "ulf_items",
+                                                          "static_results"};
 inline constexpr const char* kBlockTable = "result_blocks";
 inline constexpr const char* kSumTable = "checksums";
 

@@ -6,6 +6,7 @@
 #include "qm_db/fileerror.h"
 #include "qm_db/pushresult.h"
 #include "qm_db/records.h"
+#include "qm_db/staticresult.h"
 
 #include <memory>
 #include <string>
@@ -19,6 +20,7 @@ enum class OPEN_MODE {
 struct T_MODEL_CONTENT {
     T_MODEL model;        // SI
     T_RESULT_MAP results; // by the key of the pushover load case; file-backed sources stay lazy
+    T_STATIC_MAP staticResults{}; // by the key of the static load case, likewise
 };
 
 /// Keeps the writer's lock of one model file until it is destroyed.

@@ -1,7 +1,7 @@
 // Reading results: eigen modes and pushover steps, in the document's current units.
 #pragma once
 
-#include "qm_db/datactrl.h"
+#include "qm_db/staticreader.h"
 
 #include <map>
 #include <string>
@@ -36,7 +36,7 @@ private:
 
 class CPostCtrl {
 public:
-    explicit CPostCtrl(CDataCtrl& data) : m_data(data), m_poverInfo(data) {}
+    explicit CPostCtrl(CDataCtrl& data) : m_data(data), m_poverInfo(data), m_static(data) {}
 
     CPoverInfo* GetPoverInfo() { return &m_poverInfo; }
 
@@ -62,6 +62,29 @@ public:
     [[nodiscard]] int GetReacNew(double& reaction);
     [[nodiscard]] int GetDispNew(int node, double& displacement);
     bool ExistNodePost(int node) const;
+
+    /// A combination of one static load case (by key), for SelectLoadCombNew.
+    static T_LCOM_D MakeLoadComb(int loadCase, double factor = 1.0);
+    /// Makes a combination of static load cases, nested or not, the current result. O(1): nothing
+    /// is read or checked before the first result is asked for. 1 done; 0 (by key) there is no
+    /// such combination, the selection stays.
+    [[nodiscard]] int SelectLoadCombNew(const T_LCOM_D& combination);
+    [[nodiscard]] int SelectLoadCombNew(int combination);
+    /// Results of the current combination in current units, superposed for this node or element
+    /// alone. Displacements and reactions: global X, Y, Z, RX, RY, RZ; a reaction is the force of
+    /// the support on the structure. 1 done; 0 output as it was and Error says why: a case of the
+    /// combination has no results, or its results are older than the model (the case is named),
+    /// there is no such node or element, the element is not of that kind.
+    [[nodiscard]] int GetDispNew(int node, T_DOF6& out);
+    [[nodiscard]] int GetReacNew(int node, T_DOF6& out);
+    /// Axial force of a truss, tension positive.
+    [[nodiscard]] int GetStrtNew(int element, double& axial);
+    /// Internal forces of a beam: axial, shear y, shear z, torsion, moment y, moment z in its local
+    /// axes, of the cut seen from the I side. position 0 to 4: I-end, 1/4, 2/4, 3/4, J-end.
+    [[nodiscard]] int GetStrbNew(int element, int position, T_DOF6& out);
+    /// 1 the static load case has results of the model as it is; 0 Error says why not.
+    [[nodiscard]] int CheckStaticResult(int loadCase);
+
     std::string Error() const { return m_error; }
 
     /// Storey drift ratios of a step, largest over the storeys: kind 1 by the storey's vertical
@@ -77,6 +100,8 @@ public:
     bool HasStoreyGaps(int loadCase) const;
 
 private:
+    int ReadForces(int element, ELEM_KIND kind, const char* otherKind, T_ELEM_FORCES& out);
+    void ToCurrentUnits(T_DOF6& values, T_DIM linear, T_DIM angular) const;
     int ReadSeries(int node, const std::vector<double>*& out);
     int ReadCurve();
     std::optional<double> StoreyMean(const T_STOR_D& storey, std::size_t step, bool byMass,
@@ -89,6 +114,7 @@ private:
 
     CDataCtrl& m_data;
     CPoverInfo m_poverInfo;
+    CStaticReader m_static;
     int m_mode = 0;
     int m_pushover = 0;
     int m_step = 0;

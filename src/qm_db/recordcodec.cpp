@@ -1,6 +1,7 @@
 #include "qm_db/recordcodec.h"
 
 #include "qm_db/checksum.h"
+#include "qm_db/recordcodecelements.h"
 #include "qm_db/recordcodecfields.h"
 #include "qm_db/storefault.h"
 
@@ -26,6 +27,7 @@ void Fields(V& v, typename V::template Ref<T_STYP_D> r)
     v("alternative_hysteresis", r.alternativeHysteresis);
     v("wall_strength_degradation", r.wallStrengthDegradation);
     v("gsd", r.gsd);
+    v("plane", r.plane);
 }
 
 template <class V>
@@ -138,6 +140,41 @@ template <class V>
 void Fields(V& v, typename V::template Ref<T_IEHP_D> r)
 {
     v("name", r.name);
+    v.Body(r);
+}
+
+template <class V>
+void Fields(V& v, typename V::template Ref<T_STLD_D> r)
+{
+    v("name", r.name);
+    v.Body(r);
+}
+template <class V>
+void Fields(V& v, typename V::template Ref<T_LCOM_D> r)
+{
+    v("name", r.name);
+    v.Body(r);
+}
+template <class V>
+void Fields(V& v, typename V::template Ref<T_ULFC_D> r)
+{
+    v("name", r.name);
+    v.Body(r);
+}
+template <class V>
+void Fields(V& v, typename V::template Ref<T_ULFI_D> r)
+{
+    v("name", r.name);
+    v.Body(r);
+}
+template <class V>
+void Fields(V& v, typename V::template Ref<T_DIAP_D> r)
+{
+    v.Body(r);
+}
+template <class V>
+void Fields(V& v, typename V::template Ref<T_EQDS_D> r)
+{
     v.Body(r);
 }
 
@@ -303,30 +340,10 @@ void GetNodeChunk(const CPackedArrays& arrays, std::int64_t chunk, T_TABLE<T_NOD
     }
 }
 
-// Elements and generated hinges are many and small: a few packed lists for all of them.
-constexpr const char* kElements = "elements";
-constexpr std::size_t kElementWidth = 6; // id, nodes, section, material, member
+// Generated hinges are many and small: a few packed lists for all of them.
 constexpr const char* kHinges = "hinges";
 constexpr std::size_t kHingeWidth = 3; // key, element, type
 constexpr std::size_t kStrengthWidth = sizeof(T_PHGE_D::crack) / sizeof(double); // crack; yield
-
-void PutElements(const T_TABLE<T_ELEM_D>& elements, CPackedArrays& arrays)
-{
-    std::vector<int> all;
-    for (const auto& [key, e] : elements)
-        all.insert(all.end(), {key, e.nodeI, e.nodeJ, e.section, e.material, e.member});
-    if (!all.empty()) arrays.Put(kElements, 0, "data", all);
-}
-
-void GetElements(const CPackedArrays& arrays, T_TABLE<T_ELEM_D>& elements)
-{
-    const std::vector<int> all = arrays.Ints(kElements, 0, "data");
-    if (all.size() % kElementWidth != 0) ThrowDamaged(kElements);
-    for (std::size_t i = 0; i < all.size(); i += kElementWidth)
-        elements.insert_or_assign(
-            elements.end(), all[i],
-            T_ELEM_D{all[i], all[i + 1], all[i + 2], all[i + 3], all[i + 4], all[i + 5]});
-}
 
 void PutHinges(const T_TABLE<T_PHGE_D>& hinges, CPackedArrays& arrays)
 {
@@ -387,6 +404,12 @@ void WriteModel(const CSqliteDb& db, const T_MODEL& model)
     WriteTable(db, "hinge_types", model.hingeTypes, arrays);
     WriteTable(db, "inelastic_hinges", model.inelasticHinges, arrays);
     WriteTable(db, "increment_functions", model.incrementFunctions, arrays);
+    WriteTable(db, "diaphragms", model.diaphragms, arrays);
+    WriteTable(db, "equal_displacements", model.equalDisplacements, arrays);
+    WriteTable(db, "load_cases", model.loadCases, arrays);
+    WriteTable(db, "combinations", model.combinations, arrays);
+    WriteTable(db, "ulf_constraints", model.ulfConstraints, arrays);
+    WriteTable(db, "ulf_items", model.ulfItems, arrays);
     arrays.Write(db);
 }
 
@@ -414,6 +437,12 @@ T_MODEL ReadModel(const CSqliteDb& db, T_TABLE_SUMS& sums)
     model.hingeTypes = ReadTable<T_PHGT_D>(db, "hinge_types", arrays, sums);
     model.inelasticHinges = ReadTable<T_IEHP_D>(db, "inelastic_hinges", arrays, sums);
     model.incrementFunctions = ReadTable<T_POFC_D>(db, "increment_functions", arrays, sums);
+    model.diaphragms = ReadTable<T_DIAP_D>(db, "diaphragms", arrays, sums);
+    model.equalDisplacements = ReadTable<T_EQDS_D>(db, "equal_displacements", arrays, sums);
+    model.loadCases = ReadTable<T_STLD_D>(db, "load_cases", arrays, sums);
+    model.combinations = ReadTable<T_LCOM_D>(db, "combinations", arrays, sums);
+    model.ulfConstraints = ReadTable<T_ULFC_D>(db, "ulf_constraints", arrays, sums);
+    model.ulfItems = ReadTable<T_ULFI_D>(db, "ulf_items", arrays, sums);
     GetElements(arrays, model.elements);
     GetHinges(arrays, model.hinges);
     return model;

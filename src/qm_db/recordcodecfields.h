@@ -45,6 +45,10 @@ public:
     {
         (*this)(column, static_cast<int>(value));
     }
+    void operator()(const std::string& column, MODEL_PLANE value)
+    {
+        (*this)(column, static_cast<int>(value));
+    }
     template <class T>
     void operator()(const std::string& column, const std::optional<T>& value)
     {
@@ -156,6 +160,13 @@ public:
         value = static_cast<PUSH_METHOD>(code);
         if (value < PUSH_METHOD::Fema440 || value > PUSH_METHOD::Ntc2018)
             m_row.ThrowBadCell(column);
+    }
+    void operator()(const std::string& column, MODEL_PLANE& value) const
+    {
+        int code = 0;
+        (*this)(column, code);
+        value = static_cast<MODEL_PLANE>(code);
+        if (value < MODEL_PLANE::XY || value > MODEL_PLANE::YZ) m_row.ThrowBadCell(column);
     }
     template <class T>
     void operator()(const std::string& column, std::optional<T>& value) const

@@ -2,6 +2,7 @@
 #pragma once
 
 #include "qm_db/hingerecords.h"
+#include "qm_db/loadrecords.h"
 #include "qm_db/units.h"
 
 #include <array>
@@ -21,6 +22,9 @@ struct T_DESIGN_CODES {
     bool operator==(const T_DESIGN_CODES&) const = default;
 };
 
+/// Plane of a plane model; the displacements out of it are restrained at every node.
+enum class MODEL_PLANE { XY, XZ, YZ };
+
 /// Structure type: what holds for the whole model.
 struct T_STYP_D {
     std::string title;
@@ -31,6 +35,7 @@ struct T_STYP_D {
     bool alternativeHysteresis = false;   // alternative hysteresis models are in use
     bool wallStrengthDegradation = false; // wall types offer the strength degradation curve
     bool gsd = false;                     // My and Mz offer the section-based curve
+    std::optional<MODEL_PLANE> plane{};   // absent: a space model
     bool operator==(const T_STYP_D&) const = default;
 };
 
@@ -213,5 +218,11 @@ struct T_MODEL {
     T_TABLE<T_PHGE_D> hinges;             // likewise
     T_TABLE<T_IEHP_D> inelasticHinges;    // likewise
     T_TABLE<T_POFC_D> incrementFunctions; // likewise
+    T_TABLE<T_DIAP_D> diaphragms;         // likewise
+    T_TABLE<T_EQDS_D> equalDisplacements; // likewise
+    T_TABLE<T_STLD_D> loadCases;          // likewise
+    T_TABLE<T_LCOM_D> combinations;       // likewise
+    T_TABLE<T_ULFC_D> ulfConstraints;     // likewise
+    T_TABLE<T_ULFI_D> ulfItems;           // likewise
     bool operator==(const T_MODEL&) const = default;
 };

@@ -37,3 +37,15 @@ void ForEachQuantity(T_POLC_D& r, const QuantityFn& f)
 {
     Visit(r, f);
 }
+void ForEachQuantity(T_ELEM_D& r, const QuantityFn& f)
+{
+    Visit(r, f);
+}
+void ForEachQuantity(T_STLD_D& r, const QuantityFn& f)
+{
+    Visit(r, f);
+}
+void ForEachQuantity(T_ULFC_D& r, const QuantityFn& f)
+{
+    Visit(r, f);
+}

@@ -43,6 +43,9 @@ void ForEachQuantity(T_PHGT_D& r, const QuantityFn& f);
 void ForEachQuantity(T_PHGE_D& r, const QuantityFn& f);
 void ForEachQuantity(T_IEHP_D& r, const QuantityFn& f);
 void ForEachQuantity(T_POLC_D& r, const QuantityFn& f);
+void ForEachQuantity(T_ELEM_D& r, const QuantityFn& f);
+void ForEachQuantity(T_STLD_D& r, const QuantityFn& f);
+void ForEachQuantity(T_ULFC_D& r, const QuantityFn& f);
 
 // Mode shapes are in the normalisation of their source; the others hold no lengths.
 template <class F>
@@ -50,7 +53,19 @@ void ForEachQuantity(T_EIGV_D&, F&&)
 {
 }
 template <class F>
-void ForEachQuantity(T_ELEM_D&, F&&)
+void ForEachQuantity(T_DIAP_D&, F&&)
+{
+}
+template <class F>
+void ForEachQuantity(T_EQDS_D&, F&&)
+{
+}
+template <class F>
+void ForEachQuantity(T_LCOM_D&, F&&)
+{
+}
+template <class F>
+void ForEachQuantity(T_ULFI_D&, F&&)
 {
 }
 template <class F>

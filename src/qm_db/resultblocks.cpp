@@ -22,10 +22,15 @@ struct T_PART {
     const char* nameKey;
     int width;
 };
-constexpr std::array<T_PART, 4> kParts{{{"IDS_QM_DB_PART_LOAD_FACTORS", 8},
+constexpr std::array<T_PART, 9> kParts{{{"IDS_QM_DB_PART_LOAD_FACTORS", 8},
                                         {"IDS_QM_DB_PART_BASE_REACTIONS", 8},
                                         {"IDS_QM_DB_PART_NODE_IDS", 4},
-                                        {"IDS_QM_DB_PART_DISPLACEMENTS", 8}}};
+                                        {"IDS_QM_DB_PART_DISPLACEMENTS", 8},
+                                        {"IDS_QM_DB_PART_NODE_IDS", 4},
+                                        {"IDS_QM_DB_PART_ELEMENT_IDS", 4},
+                                        {"IDS_QM_DB_PART_DISPLACEMENTS", 8},
+                                        {"IDS_QM_DB_PART_REACTIONS", 8},
+                                        {"IDS_QM_DB_PART_FORCES", 8}}};
 
 const T_PART& PartOf(const T_BLOCK_KEY& key)
 {
@@ -47,9 +52,7 @@ std::int64_t SumOf(const T_BLOCK_KEY& key, int count, std::span<const std::byte>
 class CResultWriter {
 public:
     CResultWriter(const CSqliteDb& db, int pushover, IPushResult& source)
-        : m_db(db), m_pushover(pushover), m_source(source),
-          m_insert(db, std::string("INSERT INTO ") + kBlockTable + '(' + kBlockColumns +
-                           ") VALUES(?1, ?2, ?3, ?4, ?5, ?6, 'little', ?7, ?8)")
+        : m_db(db), m_pushover(pushover), m_source(source), m_blocks(db)
     {
     }
 
@@ -66,11 +69,12 @@ public:
         CheckSeries(baseReaction, "base_reaction");
 
         WriteHead();
-        WriteBlock({m_pushover, BLOCK_PART::LoadFactor}, std::span<const double>(loadFactor));
-        WriteBlock({m_pushover, BLOCK_PART::BaseReaction}, std::span<const double>(baseReaction));
+        m_blocks.Write({m_pushover, BLOCK_PART::LoadFactor}, std::span<const double>(loadFactor));
+        m_blocks.Write({m_pushover, BLOCK_PART::BaseReaction},
+                       std::span<const double>(baseReaction));
         const int chunks = ChunkCount(static_cast<int>(m_nodes.size()));
         for (int chunk = 0; chunk < chunks; ++chunk)
-            WriteBlock({m_pushover, BLOCK_PART::NodeIds, chunk}, NodesOf(chunk));
+            m_blocks.Write({m_pushover, BLOCK_PART::NodeIds, chunk}, NodesOf(chunk));
         for (int chunk = 0; chunk < chunks; ++chunk)
             WriteDisplacements(chunk);
     }
@@ -124,41 +128,60 @@ private:
         for (std::size_t step = 0; step < m_steps; ++step) {
             const auto row =
                 std::span<const double>(values).subspan(step * nodes.size(), nodes.size());
-            WriteBlock({m_pushover, BLOCK_PART::Displacement, chunk, static_cast<int>(step)}, row);
+            m_blocks.Write({m_pushover, BLOCK_PART::Displacement, chunk, static_cast<int>(step)},
+                           row);
         }
-    }
-
-    template <class T>
-    void WriteBlock(const T_BLOCK_KEY& key, std::span<const T> values)
-    {
-        const std::span<const std::byte> bytes = std::as_bytes(values);
-        const int count = static_cast<int>(values.size());
-        int at = 0;
-        for (const int field : {key.pushover, static_cast<int>(key.part), key.chunk, key.step,
-                                count, PartOf(key).width})
-            m_insert.Bind(++at, std::int64_t{field});
-        m_insert.Bind(++at, SumOf(key, count, bytes));
-        m_insert.Bind(++at, bytes);
-        m_insert.Run();
     }
 
     const CSqliteDb& m_db;
     int m_pushover;
     IPushResult& m_source;
-    CSqliteStmt m_insert;
+    CBlockWriter m_blocks;
     std::size_t m_steps = 0;
     std::vector<int> m_nodes; // ascending
 };
 
-/// A whole number of a head that must not be negative.
+} // namespace
+
+CBlockWriter::CBlockWriter(const CSqliteDb& db)
+    : m_insert(db, std::string("INSERT INTO ") + kBlockTable + '(' + kBlockColumns +
+                       ") VALUES(?1, ?2, ?3, ?4, ?5, ?6, 'little', ?7, ?8)")
+{
+}
+
+void CBlockWriter::Insert(const T_BLOCK_KEY& key, int count, std::span<const std::byte> bytes)
+{
+    int at = 0;
+    for (const int field :
+         {key.pushover, static_cast<int>(key.part), key.chunk, key.step, count, PartOf(key).width})
+        m_insert.Bind(++at, std::int64_t{field});
+    m_insert.Bind(++at, SumOf(key, count, bytes));
+    m_insert.Bind(++at, bytes);
+    m_insert.Run();
+}
+
+CBlockRun::CBlockRun(const CSqliteDb& db, T_BLOCK_KEY key)
+    : m_key(key), m_rows(db, std::string("SELECT ") + kBlockColumns + " FROM " + kBlockTable +
+                                 " WHERE pushover = ?1 AND part = ?2 AND chunk = ?3 "
+                                 "ORDER BY step")
+{
+    m_rows.Bind(1, std::int64_t{key.pushover});
+    m_rows.Bind(2, std::int64_t{static_cast<int>(key.part)});
+    m_rows.Bind(3, std::int64_t{key.chunk});
+}
+
+std::span<const std::byte> CBlockRun::Step(int count)
+{
+    if (!m_rows.Step()) ThrowBadBlock(m_key);
+    return CheckedBlock(m_rows, m_key, count);
+}
+
 int HeadField(const CRecordRow& row, const char* column)
 {
     const auto* const value = std::get_if<std::int64_t>(&row.Get(column));
     if (!value || *value < 0 || *value > std::numeric_limits<int>::max()) row.ThrowBadCell(column);
     return static_cast<int>(*value);
 }
-
-} // namespace
 
 void ThrowBadBlock(const T_BLOCK_KEY& key)
 {
@@ -207,7 +230,8 @@ std::vector<T_RESULT_HEAD> ReadResultHeads(const CSqliteDb& db, T_TABLE_SUMS& su
 void CheckBlocks(const CSqliteDb& db, const std::vector<T_RESULT_HEAD>& heads)
 {
     CSqliteStmt rows(db, std::string("SELECT ") + kBlockColumns + " FROM " + kBlockTable +
-                             " ORDER BY pushover, part, chunk, step");
+                             " WHERE part < ?1 ORDER BY pushover, part, chunk, step");
+    rows.Bind(1, std::int64_t{static_cast<int>(BLOCK_PART::StaticNodes)});
     const auto check = [&](const T_BLOCK_KEY& key, int count) {
         if (!rows.Step()) ThrowBadBlock(key);
         CheckedBlock(rows, key, count);

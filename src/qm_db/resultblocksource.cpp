@@ -10,40 +10,6 @@
 #include <cmath>
 #include <cstring>
 
-namespace {
-
-/// The blocks of one part and chunk in the order of steps.
-class CBlockRun {
-public:
-    CBlockRun(const CSqliteDb& db, T_BLOCK_KEY key)
-        : m_key(key), m_rows(db, std::string("SELECT ") + kBlockColumns + " FROM " + kBlockTable +
-                                     " WHERE pushover = ?1 AND part = ?2 AND chunk = ?3 "
-                                     "ORDER BY step")
-    {
-        m_rows.Bind(1, std::int64_t{key.pushover});
-        m_rows.Bind(2, std::int64_t{static_cast<int>(key.part)});
-        m_rows.Bind(3, std::int64_t{key.chunk});
-    }
-
-    /// Appends the numbers of the next step.
-    template <class T>
-    void Next(int count, std::vector<T>& out)
-    {
-        if (!m_rows.Step()) ThrowBadBlock(m_key);
-        const std::span<const std::byte> bytes = CheckedBlock(m_rows, m_key, count);
-        const std::size_t at = out.size();
-        out.resize(at + static_cast<std::size_t>(count));
-        if (!bytes.empty()) std::memcpy(out.data() + at, bytes.data(), bytes.size());
-        ++m_key.step;
-    }
-
-private:
-    T_BLOCK_KEY m_key;
-    CSqliteStmt m_rows;
-};
-
-} // namespace
-
 CBlockPushResult::CBlockPushResult(std::shared_ptr<const CSqliteDb> db, std::string path,
                                    T_RESULT_HEAD head)
     : m_db(std::move(db)), m_path(std::move(path)), m_head(head)

@@ -23,18 +23,19 @@ const char* SymbolOf(RULE_TEXT kind, int component)
 
 T_FINDING FindingOf(const T_RULE_HEAD& head, const T_PLACE& place)
 {
-    const char* symbol = SymbolOf(head.kind, place.component);
-    const char* text = IsMoment(place.component) && head.textMoment ? head.textMoment : head.text;
+    const int component = head.component >= 0 ? head.component : place.component;
+    const char* symbol = SymbolOf(head.kind, component);
+    const char* text = IsMoment(component) && head.textMoment ? head.textMoment : head.text;
     const std::string list =
         place.curve < 0 ? std::string() : "curves[" + std::to_string(place.curve) + "].";
 
     T_FINDING f;
-    f.field = list + head.field;
+    f.field = place.prefix + list + head.field;
     f.messageKey = head.messageKey;
-    f.component = place.component;
+    f.component = component;
     f.end = place.end;
     f.side = head.side;
-    f.point = head.point;
+    f.point = *head.point ? head.point : place.point;
     if (!text)
         f.ruleText = head.messageKey;
     else
@@ -42,9 +43,8 @@ T_FINDING FindingOf(const T_RULE_HEAD& head, const T_PLACE& place)
     const std::string shown = head.kind == RULE_TEXT::Key && text
                                   ? MMSGFunction::GetValue(text) + head.suffix
                                   : f.ruleText;
-    const char* name = place.component >= 0 && place.component < 6
-                           ? kComponentNames[static_cast<std::size_t>(place.component)]
-                           : "";
+    const char* name =
+        component >= 0 && component < 6 ? kComponentNames[static_cast<std::size_t>(component)] : "";
     f.text = MMSGFunction::Format(head.messageKey, {name, shown});
     if (head.wordingKey)
         f.wording = MMSGFunction::Format(

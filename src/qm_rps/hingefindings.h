@@ -29,6 +29,8 @@ struct T_PLACE {
     int component = -1;
     HINGE_END end = HINGE_END::Both;
     int curve = -1;
+    std::string prefix{}; // of the field: "masonry."
+    std::string point{};  // where the rule names none
 };
 
 /// What a rule's text is: a literal (with %s for the symbol of deformation "D" or strength "F" or
@@ -47,6 +49,7 @@ struct T_RULE_HEAD {
     const char* suffix = "";            // follows a catalogue text: " > 0"
     const char* wordingKey = nullptr;   // relation in words, {1} left, {2} right
     const char *left = "", *right = ""; // with %s for the symbol
+    int component = -1;                 // of a rule that belongs to one; -1: the place's
 };
 
 template <class DATA>

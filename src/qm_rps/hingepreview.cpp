@@ -201,6 +201,7 @@ int BackboneOf(const T_SKEL_CURVE& curve, SKEL_TYPE type, T_HINGE_PREVIEW& out)
     } else if (const auto* f = std::get_if<T_SKEL_FEMA>(&curve)) {
         const bool list = f->multiCurve && !f->curves.empty();
         Backbone(list ? f->curves.front().sides : f->sides, f->symmetric, f->measure, p);
+        if (!f->compliance) p.marks.clear(); // inactive criteria
     } else {
         const T_SKEL_EC8& e = std::get<T_SKEL_EC8>(curve);
         Backbone(e.sides, e.symmetric, e.measure, p);

@@ -24,159 +24,191 @@ bool TwoSided(const B& b)
 {
     return !b.symmetric;
 }
-bool RisesPos(const B& b)
-{
-    return b.pos.C.strength > b.pos.B.strength && !SameStrength(b.pos.C.strength, b.pos.B.strength);
-}
-bool RisesNeg(const B& b)
-{
-    return b.neg.C.strength < b.neg.B.strength && !SameStrength(b.neg.C.strength, b.neg.B.strength);
-}
-bool FlatEndPos(const B& b)
-{
-    return SameStrength(b.pos.D.strength, b.pos.E.strength);
-}
-bool FlatEndNeg(const B& b)
-{
-    return SameStrength(b.neg.D.strength, b.neg.E.strength);
-}
 
-// Conditions that stand in both order tables.
-bool BelowBCPos(const B& b)
+// Conditions of one side, S = 1 or -1: values times S, so that the negative side reads like the
+// positive one.
+template <int S>
+const T_SKEL_SIDE& Side(const B& b)
 {
-    return Below(b.pos.B.deform, b.pos.C.deform);
+    return S > 0 ? b.pos : b.neg;
 }
-bool BelowBCNeg(const B& b)
+template <int S>
+bool Applies(const B& b)
 {
-    return Below(b.neg.C.deform, b.neg.B.deform);
+    return S > 0 || TwoSided(b);
 }
-bool ChainPos(const B& b)
+using T_POINT_OF = T_SKEL_POINT T_SKEL_SIDE::*;
+constexpr T_POINT_OF kB = &T_SKEL_SIDE::B, kC = &T_SKEL_SIDE::C, kD = &T_SKEL_SIDE::D,
+                     kE = &T_SKEL_SIDE::E;
+using T_VALUE_OF = double T_SKEL_POINT::*;
+constexpr T_VALUE_OF kDeform = &T_SKEL_POINT::deform, kStrength = &T_SKEL_POINT::strength;
+
+template <int S, T_VALUE_OF V, T_POINT_OF P>
+double Value(const B& b)
 {
-    return NotAbove(b.pos.C.deform, b.pos.D.deform) && NotAbove(b.pos.D.deform, b.pos.E.deform);
+    return S * (Side<S>(b).*P.*V);
 }
-bool ChainNeg(const B& b)
+template <int S, T_VALUE_OF V, T_POINT_OF P>
+bool Above0(const B& b)
 {
-    return NotAbove(b.neg.E.deform, b.neg.D.deform) && NotAbove(b.neg.D.deform, b.neg.C.deform);
+    return Below(0, Value<S, V, P>(b));
 }
-bool BelowDEPos(const B& b)
+template <int S, T_VALUE_OF V, T_POINT_OF P>
+bool NotBelow0(const B& b)
 {
-    return Below(b.pos.D.deform, b.pos.E.deform);
+    return NotAbove(0, Value<S, V, P>(b));
 }
-bool BelowDENeg(const B& b)
+template <int S, T_VALUE_OF V, T_POINT_OF P, T_POINT_OF Q>
+bool Less(const B& b)
 {
-    return Below(b.neg.E.deform, b.neg.D.deform);
+    return Below(Value<S, V, P>(b), Value<S, V, Q>(b));
 }
-bool StrengthBCPos(const B& b)
+template <int S, T_VALUE_OF V, T_POINT_OF P, T_POINT_OF Q>
+bool NotMore(const B& b)
 {
-    return NotAbove(b.pos.B.strength, b.pos.C.strength);
+    return NotAbove(Value<S, V, P>(b), Value<S, V, Q>(b));
 }
-bool StrengthBCNeg(const B& b)
+template <int S>
+bool Chain(const B& b)
 {
-    return NotAbove(b.neg.C.strength, b.neg.B.strength);
+    return NotMore<S, kDeform, kC, kD>(b) && NotMore<S, kDeform, kD, kE>(b);
 }
-bool StrengthDCPos(const B& b)
+template <int S>
+bool ChainFromB(const B& b)
 {
-    return Below(b.pos.D.strength, b.pos.C.strength);
+    return NotMore<S, kDeform, kB, kC>(b) && Chain<S>(b);
 }
-bool StrengthDCNeg(const B& b)
+/// The strength rises from B to C.
+template <int S>
+bool Up(const B& b)
 {
-    return Below(b.neg.C.strength, b.neg.D.strength);
+    return Less<S, kStrength, kB, kC>(b) &&
+           !SameStrength(Side<S>(b).C.strength, Side<S>(b).B.strength);
 }
-bool LossPos(const B& b)
+template <int S>
+bool Rises(const B& b)
 {
-    return b.strengthLoss;
+    return Applies<S>(b) && Up<S>(b);
 }
-bool NoLossPos(const B& b)
+template <int S>
+bool RisesNot(const B& b)
 {
-    return !b.strengthLoss;
+    return Applies<S>(b) && !Up<S>(b);
 }
-bool LossNeg(const B& b)
+template <int S>
+bool FlatEnd(const B& b)
 {
-    return TwoSided(b) && b.strengthLoss;
+    return SameStrength(Side<S>(b).D.strength, Side<S>(b).E.strength);
 }
-bool NoLossNeg(const B& b)
+template <int S>
+bool EndsFlat(const B& b)
 {
-    return TwoSided(b) && !b.strengthLoss;
+    return Applies<S>(b) && FlatEnd<S>(b);
 }
+/// A plastic deformation is 0 at B.
+template <int S>
+bool Ratios(const B& b)
+{
+    return Applies<S>(b) && b.ratios;
+}
+template <int S>
+bool Loss(const B& b)
+{
+    return Applies<S>(b) && b.strengthLoss;
+}
+template <int S>
+bool NoLoss(const B& b)
+{
+    return Applies<S>(b) && !b.strengthLoss;
+}
+template <int S>
+bool Criteria(const B& b)
+{
+    return Applies<S>(b) && b.criteria;
+}
+template <int S, double T_SKEL_SIDE::*LOW, double T_SKEL_SIDE::*HIGH>
+bool InOrder(const B& b)
+{
+    return NotAbove(S * (Side<S>(b).*LOW), S * (Side<S>(b).*HIGH));
+}
+constexpr auto kIO = &T_SKEL_SIDE::IO, kLS = &T_SKEL_SIDE::LS, kCP = &T_SKEL_SIDE::CP;
 
 // clang-format off
 const R kSignPos[] = {
-    {{kMsg, kStr, "%s(B) > 0",  nullptr, "sides.pos.B.strength", kPos, "B"}, [](const B& b) { return Below(0, b.pos.B.strength); }},
-    {{kMsg, kDef, "%s(B) > 0",  nullptr, "sides.pos.B.deform",   kPos, "B"}, [](const B& b) { return Below(0, b.pos.B.deform); },
-     [](const B& b) { return b.ratios; }}, // a plastic deformation is 0 at B
-    {{kMsg, kStr, "%s(C) > 0",  nullptr, "sides.pos.C.strength", kPos, "C"}, [](const B& b) { return Below(0, b.pos.C.strength); }},
-    {{kMsg, kStr, "%s(D) >= 0", nullptr, "sides.pos.D.strength", kPos, "D"}, [](const B& b) { return NotAbove(0, b.pos.D.strength); }},
-    {{kMsg, kStr, "%s(E) >= 0", nullptr, "sides.pos.E.strength", kPos, "E"}, [](const B& b) { return NotAbove(0, b.pos.E.strength); }},
+    {{kMsg, kStr, "%s(B) > 0",  nullptr, "sides.pos.B.strength", kPos, "B"}, Above0<1, kStrength, kB>},
+    {{kMsg, kDef, "%s(B) > 0",  nullptr, "sides.pos.B.deform",   kPos, "B"}, Above0<1, kDeform, kB>, Ratios<1>},
+    {{kMsg, kStr, "%s(C) > 0",  nullptr, "sides.pos.C.strength", kPos, "C"}, Above0<1, kStrength, kC>},
+    {{kMsg, kStr, "%s(D) >= 0", nullptr, "sides.pos.D.strength", kPos, "D"}, NotBelow0<1, kStrength, kD>},
+    {{kMsg, kStr, "%s(E) >= 0", nullptr, "sides.pos.E.strength", kPos, "E"}, NotBelow0<1, kStrength, kE>},
 };
 const R kSignNeg[] = {
-    {{kMsg, kStr, "%s(-B) < 0",  nullptr, "sides.neg.B.strength", kNeg, "B"}, [](const B& b) { return Below(b.neg.B.strength, 0); }, TwoSided},
-    {{kMsg, kDef, "%s(-B) < 0",  nullptr, "sides.neg.B.deform",   kNeg, "B"}, [](const B& b) { return Below(b.neg.B.deform, 0); },
-     [](const B& b) { return TwoSided(b) && b.ratios; }},
-    {{kMsg, kStr, "%s(-C) < 0",  nullptr, "sides.neg.C.strength", kNeg, "C"}, [](const B& b) { return Below(b.neg.C.strength, 0); }, TwoSided},
-    {{kMsg, kStr, "%s(-D) <= 0", nullptr, "sides.neg.D.strength", kNeg, "D"}, [](const B& b) { return NotAbove(b.neg.D.strength, 0); }, TwoSided},
-    {{kMsg, kStr, "%s(-E) <= 0", nullptr, "sides.neg.E.strength", kNeg, "E"}, [](const B& b) { return NotAbove(b.neg.E.strength, 0); }, TwoSided},
+    {{kMsg, kStr, "%s(-B) < 0",  nullptr, "sides.neg.B.strength", kNeg, "B"}, Above0<-1, kStrength, kB>, TwoSided},
+    {{kMsg, kDef, "%s(-B) < 0",  nullptr, "sides.neg.B.deform",   kNeg, "B"}, Above0<-1, kDeform, kB>, Ratios<-1>},
+    {{kMsg, kStr, "%s(-C) < 0",  nullptr, "sides.neg.C.strength", kNeg, "C"}, Above0<-1, kStrength, kC>, TwoSided},
+    {{kMsg, kStr, "%s(-D) <= 0", nullptr, "sides.neg.D.strength", kNeg, "D"}, NotBelow0<-1, kStrength, kD>, TwoSided},
+    {{kMsg, kStr, "%s(-E) <= 0", nullptr, "sides.neg.E.strength", kNeg, "E"}, NotBelow0<-1, kStrength, kE>, TwoSided},
 };
 
 // Deformations first, then strengths; positive side first. The spacing of the texts is meant.
 const R kFemaOrder[] = {
-    {{kMsg, kDef, "%s(B) <  %s(C)", nullptr, "sides.pos.C.deform", kPos, "C"}, BelowBCPos, RisesPos},
+    {{kMsg, kDef, "%s(B) <  %s(C)", nullptr, "sides.pos.C.deform", kPos, "C"}, Less<1, kDeform, kB, kC>, Rises<1>},
     {{kMsg, kDef, "%s(B) <= %s(C)", nullptr, "sides.pos.C.deform", kPos, "C", "", kNotLess, "%s(C)", "%s(B)"},
-     [](const B& b) { return NotAbove(b.pos.B.deform, b.pos.C.deform); }, [](const B& b) { return !RisesPos(b); }},
-    {{kMsg, kDef, "%s(C) <= %s(D) <= %s(E)", nullptr, "sides.pos.D.deform", kPos, "D"}, ChainPos},
-    {{kMsg, kDef, "%s(D) <  %s(E)", nullptr, "sides.pos.E.deform", kPos, "E"}, BelowDEPos, FlatEndPos},
-    {{kMsg, kStr, "%s(B) <= %s(C)", nullptr, "sides.pos.C.strength", kPos, "C", "", kNotLess, "%s(C)", "%s(B)"}, StrengthBCPos},
-    {{kMsg, kStr, "%s(D) <  %s(C)", nullptr, "sides.pos.D.strength", kPos, "D"}, StrengthDCPos, LossPos},
+     NotMore<1, kDeform, kB, kC>, RisesNot<1>},
+    {{kMsg, kDef, "%s(C) <= %s(D) <= %s(E)", nullptr, "sides.pos.D.deform", kPos, "D"}, Chain<1>},
+    {{kMsg, kDef, "%s(D) <  %s(E)", nullptr, "sides.pos.E.deform", kPos, "E"}, Less<1, kDeform, kD, kE>, FlatEnd<1>},
+    {{kMsg, kStr, "%s(B) <= %s(C)", nullptr, "sides.pos.C.strength", kPos, "C", "", kNotLess, "%s(C)", "%s(B)"}, NotMore<1, kStrength, kB, kC>},
+    {{kMsg, kStr, "%s(D) <  %s(C)", nullptr, "sides.pos.D.strength", kPos, "D"}, Less<1, kStrength, kD, kC>, Loss<1>},
     {{kMsg, kStr, "%s(E) <= %s(D)", nullptr, "sides.pos.E.strength", kPos, "E", "", kNotLess, "%s(D)", "%s(E)"},
-     [](const B& b) { return NotAbove(b.pos.E.strength, b.pos.D.strength); }, LossPos},
-    {{kMsg, kStr, "%s(E) = %s(D)",  nullptr, "sides.pos.E.strength", kPos, "E", "", kEqual, "%s(E)", "%s(D)"}, FlatEndPos, NoLossPos},
+     NotMore<1, kStrength, kE, kD>, Loss<1>},
+    {{kMsg, kStr, "%s(E) = %s(D)",  nullptr, "sides.pos.E.strength", kPos, "E", "", kEqual, "%s(E)", "%s(D)"}, FlatEnd<1>, NoLoss<1>},
 
-    {{kMsg, kDef, "%s(-C) < %s(-B)", nullptr, "sides.neg.C.deform", kNeg, "C"}, BelowBCNeg,
-     [](const B& b) { return TwoSided(b) && RisesNeg(b); }},
+    {{kMsg, kDef, "%s(-C) < %s(-B)", nullptr, "sides.neg.C.deform", kNeg, "C"}, Less<-1, kDeform, kB, kC>,
+     Rises<-1>},
     {{kMsg, kDef, "%s(-C) <= %s(-B)", nullptr, "sides.neg.C.deform", kNeg, "C", "", kNotLess, "%s(-B)", "%s(-C)"},
-     [](const B& b) { return NotAbove(b.neg.C.deform, b.neg.B.deform); }, [](const B& b) { return TwoSided(b) && !RisesNeg(b); }},
-    {{kMsg, kDef, "%s(-E) <=  %s(-D) <= %s(-C)", nullptr, "sides.neg.D.deform", kNeg, "D"}, ChainNeg, TwoSided},
-    {{kMsg, kDef, "%s(-E) <  %s(-D)", nullptr, "sides.neg.E.deform", kNeg, "E"}, BelowDENeg,
-     [](const B& b) { return TwoSided(b) && FlatEndNeg(b); }},
-    {{kMsg, kStr, "%s(-C) <= %s(-B)", nullptr, "sides.neg.C.strength", kNeg, "C", "", kNotLess, "%s(-B)", "%s(-C)"}, StrengthBCNeg, TwoSided},
-    {{kMsg, kStr, "%s(-C) <  %s(-D)", nullptr, "sides.neg.D.strength", kNeg, "D"}, StrengthDCNeg, LossNeg},
+     NotMore<-1, kDeform, kB, kC>, RisesNot<-1>},
+    {{kMsg, kDef, "%s(-E) <=  %s(-D) <= %s(-C)", nullptr, "sides.neg.D.deform", kNeg, "D"}, Chain<-1>, TwoSided},
+    {{kMsg, kDef, "%s(-E) <  %s(-D)", nullptr, "sides.neg.E.deform", kNeg, "E"}, Less<-1, kDeform, kD, kE>,
+     EndsFlat<-1>},
+    {{kMsg, kStr, "%s(-C) <= %s(-B)", nullptr, "sides.neg.C.strength", kNeg, "C", "", kNotLess, "%s(-B)", "%s(-C)"}, NotMore<-1, kStrength, kB, kC>, TwoSided},
+    {{kMsg, kStr, "%s(-C) <  %s(-D)", nullptr, "sides.neg.D.strength", kNeg, "D"}, Less<-1, kStrength, kD, kC>, Loss<-1>},
     {{kMsg, kStr, "%s(-D) <= %s(-E)", nullptr, "sides.neg.E.strength", kNeg, "E", "", kNotLess, "%s(-E)", "%s(-D)"},
-     [](const B& b) { return NotAbove(b.neg.D.strength, b.neg.E.strength); }, LossNeg},
-    {{kMsg, kStr, "%s(-E) = %s(-D)",  nullptr, "sides.neg.E.strength", kNeg, "E", "", kEqual, "%s(-E)", "%s(-D)"}, FlatEndNeg, NoLossNeg},
+     NotMore<-1, kStrength, kE, kD>, Loss<-1>},
+    {{kMsg, kStr, "%s(-E) = %s(-D)",  nullptr, "sides.neg.E.strength", kNeg, "E", "", kEqual, "%s(-E)", "%s(-D)"}, FlatEnd<-1>, NoLoss<-1>},
 };
 
 // EN 1998-3: D and E always share the residual strength; without strength loss it is not below C.
 const R kEc8Order[] = {
-    {{kMsg, kDef, "%s(B) <  %s(C)", nullptr, "sides.pos.C.deform", kPos, "C"}, BelowBCPos, RisesPos},
-    {{kMsg, kDef, "%s(C) <= %s(D) <= %s(E)", nullptr, "sides.pos.D.deform", kPos, "D"}, ChainPos, RisesPos},
+    {{kMsg, kDef, "%s(B) <  %s(C)", nullptr, "sides.pos.C.deform", kPos, "C"}, Less<1, kDeform, kB, kC>, Rises<1>},
+    {{kMsg, kDef, "%s(C) <= %s(D) <= %s(E)", nullptr, "sides.pos.D.deform", kPos, "D"}, Chain<1>, Rises<1>},
     {{kMsg, kDef, "%s(C) <= %s(C) <= %s(D) <= %s(E)", nullptr, "sides.pos.C.deform", kPos, "C"}, // the repeated C is meant
-     [](const B& b) { return NotAbove(b.pos.B.deform, b.pos.C.deform) && ChainPos(b); }, [](const B& b) { return !RisesPos(b); }},
-    {{kMsg, kDef, "%s(D) <  %s(E)", nullptr, "sides.pos.E.deform", kPos, "E"}, BelowDEPos, FlatEndPos},
-    {{kMsg, kStr, "%s(B) <= %s(C)", nullptr, "sides.pos.C.strength", kPos, "C", "", kNotLess, "%s(C)", "%s(B)"}, StrengthBCPos},
-    {{kMsg, kStr, "%s(D) <  %s(C)", nullptr, "sides.pos.D.strength", kPos, "D"}, StrengthDCPos, LossPos},
+     ChainFromB<1>, RisesNot<1>},
+    {{kMsg, kDef, "%s(D) <  %s(E)", nullptr, "sides.pos.E.deform", kPos, "E"}, Less<1, kDeform, kD, kE>, FlatEnd<1>},
+    {{kMsg, kStr, "%s(B) <= %s(C)", nullptr, "sides.pos.C.strength", kPos, "C", "", kNotLess, "%s(C)", "%s(B)"}, NotMore<1, kStrength, kB, kC>},
+    {{kMsg, kStr, "%s(D) <  %s(C)", nullptr, "sides.pos.D.strength", kPos, "D"}, Less<1, kStrength, kD, kC>, Loss<1>},
     {{kMsg, kStr, "%s(C) <= %s(D)", nullptr, "sides.pos.D.strength", kPos, "D", "", kNotLess, "%s(D)", "%s(C)"},
-     [](const B& b) { return NotAbove(b.pos.C.strength, b.pos.D.strength); }, NoLossPos},
-    {{kMsg, kStr, "%s(E) =  %s(D)", nullptr, "sides.pos.E.strength", kPos, "E", "", kEqual, "%s(E)", "%s(D)"}, FlatEndPos},
+     NotMore<1, kStrength, kC, kD>, NoLoss<1>},
+    {{kMsg, kStr, "%s(E) =  %s(D)", nullptr, "sides.pos.E.strength", kPos, "E", "", kEqual, "%s(E)", "%s(D)"}, FlatEnd<1>},
 
-    {{kMsg, kDef, "%s(-C) < %s(-B)", nullptr, "sides.neg.C.deform", kNeg, "C"}, BelowBCNeg,
-     [](const B& b) { return TwoSided(b) && RisesNeg(b); }},
-    {{kMsg, kDef, "%s(-E) <=  %s(-D) <= %s(-C)", nullptr, "sides.neg.D.deform", kNeg, "D"}, ChainNeg,
-     [](const B& b) { return TwoSided(b) && RisesNeg(b); }},
+    {{kMsg, kDef, "%s(-C) < %s(-B)", nullptr, "sides.neg.C.deform", kNeg, "C"}, Less<-1, kDeform, kB, kC>,
+     Rises<-1>},
+    {{kMsg, kDef, "%s(-E) <=  %s(-D) <= %s(-C)", nullptr, "sides.neg.D.deform", kNeg, "D"}, Chain<-1>,
+     Rises<-1>},
     {{kMsg, kDef, "%s(-E) <=  %s(-D) <= %s(-C) <= %s(-B)", nullptr, "sides.neg.C.deform", kNeg, "C"},
-     [](const B& b) { return NotAbove(b.neg.C.deform, b.neg.B.deform) && ChainNeg(b); }, [](const B& b) { return TwoSided(b) && !RisesNeg(b); }},
-    {{kMsg, kDef, "%s(-E) <  %s(-D)", nullptr, "sides.neg.E.deform", kNeg, "E"}, BelowDENeg,
-     [](const B& b) { return TwoSided(b) && FlatEndNeg(b); }},
-    {{kMsg, kStr, "%s(-C) <= %s(-B)", nullptr, "sides.neg.C.strength", kNeg, "C", "", kNotLess, "%s(-B)", "%s(-C)"}, StrengthBCNeg, TwoSided},
-    {{kMsg, kStr, "%s(-C) <  %s(-D)", nullptr, "sides.neg.D.strength", kNeg, "D"}, StrengthDCNeg, LossNeg},
+     ChainFromB<-1>, RisesNot<-1>},
+    {{kMsg, kDef, "%s(-E) <  %s(-D)", nullptr, "sides.neg.E.deform", kNeg, "E"}, Less<-1, kDeform, kD, kE>,
+     EndsFlat<-1>},
+    {{kMsg, kStr, "%s(-C) <= %s(-B)", nullptr, "sides.neg.C.strength", kNeg, "C", "", kNotLess, "%s(-B)", "%s(-C)"}, NotMore<-1, kStrength, kB, kC>, TwoSided},
+    {{kMsg, kStr, "%s(-C) <  %s(-D)", nullptr, "sides.neg.D.strength", kNeg, "D"}, Less<-1, kStrength, kD, kC>, Loss<-1>},
     {{kMsg, kStr, "%s(-D) <= %s(-C)", nullptr, "sides.neg.D.strength", kNeg, "D", "", kNotLess, "%s(-C)", "%s(-D)"},
-     [](const B& b) { return NotAbove(b.neg.D.strength, b.neg.C.strength); }, NoLossNeg},
-    {{kMsg, kStr, "%s(-E) =  %s(-D)", nullptr, "sides.neg.E.strength", kNeg, "E", "", kEqual, "%s(-E)", "%s(-D)"}, FlatEndNeg, TwoSided},
+     NotMore<-1, kStrength, kC, kD>, NoLoss<-1>},
+    {{kMsg, kStr, "%s(-E) =  %s(-D)", nullptr, "sides.neg.E.strength", kNeg, "E", "", kEqual, "%s(-E)", "%s(-D)"}, FlatEnd<-1>, TwoSided},
 };
 
 const R kAcceptance[] = {
-    {{kMsg, kLit, "IO <= LS", nullptr, "sides.pos.LS", kPos, "LS"}, [](const B& b) { return NotAbove(b.pos.IO, b.pos.LS); }},
-    {{kMsg, kLit, "IO <= LS", nullptr, "sides.neg.LS", kNeg, "LS"}, [](const B& b) { return NotAbove(b.neg.LS, b.neg.IO); }, TwoSided},
-    {{kMsg, kLit, "LS <= CP", nullptr, "sides.pos.CP", kPos, "CP"}, [](const B& b) { return NotAbove(b.pos.LS, b.pos.CP); }},
-    {{kMsg, kLit, "LS <= CP", nullptr, "sides.neg.CP", kNeg, "CP"}, [](const B& b) { return NotAbove(b.neg.CP, b.neg.LS); }, TwoSided},
+    {{kMsg, kLit, "IO <= LS", nullptr, "sides.pos.LS", kPos, "LS"}, InOrder<1, kIO, kLS>, Criteria<1>},
+    {{kMsg, kLit, "IO <= LS", nullptr, "sides.neg.LS", kNeg, "LS"}, InOrder<-1, kIO, kLS>, Criteria<-1>},
+    {{kMsg, kLit, "LS <= CP", nullptr, "sides.pos.CP", kPos, "CP"}, InOrder<1, kLS, kCP>, Criteria<1>},
+    {{kMsg, kLit, "LS <= CP", nullptr, "sides.neg.CP", kNeg, "CP"}, InOrder<-1, kLS, kCP>, Criteria<-1>},
 };
 
 const R kYield[] = {

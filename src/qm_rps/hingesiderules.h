@@ -15,6 +15,7 @@ struct T_BACKBONE {
     INIT_STIFFNESS initStiffness = INIT_STIFFNESS::EI6L;
     bool asymStiffness = false;
     const T_SKEL_FEMA* fema = nullptr; // options that the FEMA curve alone has
+    bool criteria = true;              // the acceptance criteria are in use
 };
 
 using T_BACKBONE_RULES = std::span<const T_RULE<T_BACKBONE>>;

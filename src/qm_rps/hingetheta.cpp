@@ -1,6 +1,6 @@
 #include "qm_rps/hingetheta.h"
 
-#include "qm_rps/sectionproperties.h"
+#include "qm_db/sectionproperties.h"
 
 #include <cmath>
 
@@ -22,6 +22,12 @@ bool ReadBasis(const T_THETA_LOOKUP& lookup, HINGE_LOCATION end, T_BASIS& out)
     if (!CSectionProperties::Calc(*lookup.section, out.section, fault)) return false;
     out.factors = end == HINGE_LOCATION::IEnd ? &out.section.factorsI : &out.section.factorsJ;
     return true;
+}
+
+/// A calculated stiffness; none where its data are missing.
+std::optional<double> Positive(double v)
+{
+    return std::isfinite(v) && v > 0.0 ? std::optional(v) : std::nullopt;
 }
 
 double Deformation(double strength, double stiffness)
@@ -46,33 +52,60 @@ double RotationFactor(INIT_STIFFNESS option)
     }
 }
 
+/// Strength over stiffness; the look-up must succeed even where the user gives the stiffness.
+double Theta(const T_THETA_LOOKUP& lookup, HINGE_COMPONENT component, HINGE_LOCATION end,
+             INIT_STIFFNESS option, double userStiffness, double strength)
+{
+    T_BASIS b;
+    if (!ReadBasis(lookup, end, b)) return 0.0;
+    const auto k = CHingeTheta::CalcStiffness(lookup, component, end, option, userStiffness);
+    return k ? Deformation(strength, *k) : 0.0;
+}
+
 } // namespace
+
+std::optional<double> CHingeTheta::CalcStiffness(const T_THETA_LOOKUP& lookup,
+                                                 HINGE_COMPONENT component, HINGE_LOCATION end,
+                                                 INIT_STIFFNESS option, double userStiffness)
+{
+    if (option == INIT_STIFFNESS::User)
+        return std::isfinite(userStiffness) ? std::optional(userStiffness) : std::nullopt;
+    T_BASIS b;
+    if (!ReadBasis(lookup, end, b)) return std::nullopt;
+    const double E = lookup.material->E, L = lookup.memberLength;
+    const double G = E / (2.0 * (1.0 + lookup.material->nu));
+    const bool elastic = option == INIT_STIFFNESS::Elastic;
+    switch (component) {
+    case HINGE_COMPONENT::Fx:
+        return Positive(E * b.section.area * b.factors->area / L);
+    case HINGE_COMPONENT::Mx:
+        return Positive(G * b.section.J * b.factors->J / L);
+    case HINGE_COMPONENT::Fy:
+        return elastic ? Positive(G * b.section.Asy * b.factors->Asy) : std::nullopt;
+    case HINGE_COMPONENT::Fz:
+        return elastic ? Positive(G * b.section.Asz * b.factors->Asz) : std::nullopt;
+    case HINGE_COMPONENT::My:
+        if (elastic) return std::nullopt;
+        return Positive(RotationFactor(option) * E * b.section.Iyy * b.factors->Iyy / L);
+    case HINGE_COMPONENT::Mz:
+        if (elastic) return std::nullopt;
+        return Positive(RotationFactor(option) * E * b.section.Izz * b.factors->Izz / L);
+    }
+    return std::nullopt;
+}
 
 double CHingeTheta::CalcThetaMoment(const T_THETA_LOOKUP& lookup, HINGE_COMPONENT component,
                                     HINGE_LOCATION end, INIT_STIFFNESS option, double userStiffness,
                                     double yieldMoment)
 {
-    T_BASIS b;
-    const bool aboutY = component == HINGE_COMPONENT::My;
-    if (!aboutY && component != HINGE_COMPONENT::Mz) return 0.0;
-    if (!ReadBasis(lookup, end, b)) return 0.0;
-    if (option == INIT_STIFFNESS::User) return Deformation(yieldMoment, userStiffness);
-    const double inertia = aboutY ? b.section.Iyy * b.factors->Iyy : b.section.Izz * b.factors->Izz;
-    return Deformation(yieldMoment,
-                       RotationFactor(option) * lookup.material->E * inertia / lookup.memberLength);
+    if (component != HINGE_COMPONENT::My && component != HINGE_COMPONENT::Mz) return 0.0;
+    return Theta(lookup, component, end, option, userStiffness, yieldMoment);
 }
 
 double CHingeTheta::CalcThetaShear(const T_THETA_LOOKUP& lookup, HINGE_COMPONENT component,
                                    HINGE_LOCATION end, INIT_STIFFNESS option, double userStiffness,
                                    double yieldForce)
 {
-    T_BASIS b;
-    const bool alongY = component == HINGE_COMPONENT::Fy;
-    if (!alongY && component != HINGE_COMPONENT::Fz) return 0.0;
-    if (!ReadBasis(lookup, end, b)) return 0.0;
-    if (option == INIT_STIFFNESS::User) return Deformation(yieldForce, userStiffness);
-    if (option != INIT_STIFFNESS::Elastic) return 0.0;
-    const double shearModulus = lookup.material->E / (2.0 * (1.0 + lookup.material->nu));
-    const double area = alongY ? b.section.Asy * b.factors->Asy : b.section.Asz * b.factors->Asz;
-    return Deformation(yieldForce, shearModulus * area);
+    if (component != HINGE_COMPONENT::Fy && component != HINGE_COMPONENT::Fz) return 0.0;
+    return Theta(lookup, component, end, option, userStiffness, yieldForce);
 }

@@ -3,6 +3,8 @@
 
 #include "qm_db/hingerecords.h"
 
+#include <optional>
+
 /// What the look-up of an element found. Not owned; a null pointer means that the section or the
 /// material is missing.
 struct T_THETA_LOOKUP {
@@ -18,6 +20,13 @@ struct T_THETA_LOOKUP {
 /// a stiffness below 1e-10 (or negative), anything that is not finite.
 class CHingeTheta {
 public:
+    /// Initial stiffness at an end: the user stiffness; else EA/L of Fx and GJ/L of Mx (any other
+    /// option), n EI/L of My and Mz, G times the shear area of Fy and Fz (Elastic). Each property
+    /// times its factor of that end. Empty where data or a method is missing.
+    static std::optional<double> CalcStiffness(const T_THETA_LOOKUP& lookup,
+                                               HINGE_COMPONENT component, HINGE_LOCATION end,
+                                               INIT_STIFFNESS option, double userStiffness);
+
     /// My or Mz. K = 6EI/L (double curvature), 3EI/L, 2EI/L or the user stiffness; I about the
     /// component's axis times the factor of that end. `end` is IEnd or JEnd.
     static double CalcThetaMoment(const T_THETA_LOOKUP& lookup, HINGE_COMPONENT component,

@@ -9,9 +9,10 @@ constexpr auto kLit = RULE_TEXT::Literal;
 
 // clang-format off
 const T_RULE<M> kRules[] = {
+    {{"IDS_QM_MASONRY_FORM", kLit, nullptr, nullptr, "form"}, [](const M& m) { return m.form == 1 || m.form == 2; }},
     {{"IDS_RPS_PO_Masonry_Comp_Strength_larger_than_0",  kLit, nullptr, nullptr, "compStrength"},  [](const M& m) { return Below(0, m.compStrength); }},
     {{"IDS_RPS_PO_Masonry_Shear_Strength_larger_than_0", kLit, nullptr, nullptr, "shearStrength"}, [](const M& m) { return Below(0, m.shearStrength); }},
-    {{"IDS_RPS_PO_Masonry_Hp_0",         kLit, nullptr, nullptr, "Hp"},           [](const M& m) { return Below(0, m.Hp); }, [](const M& m) { return m.form != 2; }},
+    {{"IDS_RPS_PO_Masonry_Hp_0",         kLit, nullptr, nullptr, "Hp"},           [](const M& m) { return Below(0, m.Hp); }, [](const M& m) { return m.form == 1; }},
     {{"IDS_RPS_PO_Masonry_Dist_Coeff_0_1", kLit, nullptr, nullptr, "distribution"},
      [](const M& m) { return Below(0, m.distribution) && NotAbove(m.distribution, 1); }, [](const M& m) { return m.form == 2; }},
 };
@@ -31,12 +32,4 @@ std::vector<T_FINDING> CPO_HingeMasonryDlg::Findings() const
     std::vector<T_FINDING> out;
     WalkRules(std::span<const T_RULE<M>>(kRules), m_masonry, {}, out);
     return out;
-}
-
-int CPO_HingeMasonryDlg::CheckData()
-{
-    const std::vector<T_FINDING> found = Findings();
-    if (found.empty()) return 1;
-    ShowMessage(found.front().messageKey, found.front().text);
-    return 0;
 }

@@ -2,10 +2,9 @@
 // coefficient. Strengths are stresses, in the caller's units.
 #pragma once
 
-#include "qm_base/mdialog.h"
-#include "qm_rps/hingefindings.h"
+#include "qm_rps/hingedialog.h"
 
-class CPO_HingeMasonryDlg : public zql::frx::MDialog {
+class CPO_HingeMasonryDlg : public CHingeDialog {
 public:
     T_MASONRY_HINGE m_masonry;
 
@@ -13,6 +12,5 @@ public:
     /// Checks, then writes. 0: `data` as it was.
     [[nodiscard]] int Dlg2Data(T_MASONRY_HINGE& data);
 
-    std::vector<T_FINDING> Findings() const;
-    int CheckData() override;
+    std::vector<T_FINDING> Findings() const override;
 };

@@ -233,14 +233,6 @@ std::vector<T_FINDING> CPO_HingeSkcvTabDlg::Findings() const
     return out;
 }
 
-int CPO_HingeSkcvTabDlg::CheckData()
-{
-    const std::vector<T_FINDING> found = Findings();
-    if (found.empty()) return 1;
-    ShowMessage(found.front().messageKey, found.front().text);
-    return 0;
-}
-
 void CPO_HingeSkcvTabDlg::CurveFindings(const T_SKEL_MULTI& curve, SKEL_TYPE type,
                                         const T_PLACE& place, std::vector<T_FINDING>& out)
 {

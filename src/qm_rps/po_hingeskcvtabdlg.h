@@ -2,10 +2,9 @@
 // Both sides hold magnitudes; units as the caller's.
 #pragma once
 
-#include "qm_base/mdialog.h"
-#include "qm_rps/hingefindings.h"
+#include "qm_rps/hingedialog.h"
 
-class CPO_HingeSkcvTabDlg : public zql::frx::MDialog {
+class CPO_HingeSkcvTabDlg : public CHingeDialog {
 public:
     /// 1 done; 0 the component has other curves.
     [[nodiscard]] int Data2Dlg(HINGE_COMPONENT c, const T_HINGE_COMPONENT& data);
@@ -25,8 +24,7 @@ public:
     /// Which sides have an initial gap; gaps of the others stay as entered and are not checked.
     void OnChangeSlipInitGap(HINGE_END end, GAP_SIDES sides);
 
-    std::vector<T_FINDING> Findings() const;
-    int CheckData() override;
+    std::vector<T_FINDING> Findings() const override;
     static void CurveFindings(const T_SKEL_MULTI& curve, SKEL_TYPE type, const T_PLACE& place,
                               std::vector<T_FINDING>& out);
 

@@ -65,14 +65,6 @@ std::vector<T_FINDING> CPO_HingeSkcvTabEuroDlg::Findings() const
     return out;
 }
 
-int CPO_HingeSkcvTabEuroDlg::CheckData()
-{
-    const std::vector<T_FINDING> found = Findings();
-    if (found.empty()) return 1;
-    ShowMessage(found.front().messageKey, found.front().text);
-    return 0;
-}
-
 void CPO_HingeSkcvTabEuroDlg::CurveFindings(const T_SKEL_EC8& curve, const T_PLACE& place,
                                             std::vector<T_FINDING>& out)
 {

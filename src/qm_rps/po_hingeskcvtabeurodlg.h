@@ -2,10 +2,9 @@
 // as acceptance criteria). Points follow the FEMA pattern; signs and units as there.
 #pragma once
 
-#include "qm_base/mdialog.h"
-#include "qm_rps/hingefindings.h"
+#include "qm_rps/hingedialog.h"
 
-class CPO_HingeSkcvTabEuroDlg : public zql::frx::MDialog {
+class CPO_HingeSkcvTabEuroDlg : public CHingeDialog {
 public:
     /// 1 done; 0 the component has other curves.
     [[nodiscard]] int Data2Dlg(HINGE_COMPONENT c, const T_HINGE_COMPONENT& data);
@@ -21,8 +20,7 @@ public:
     /// "Eurocode3:05".
     static bool IsEurocodePair(const std::string& concreteCode, const std::string& steelCode);
 
-    std::vector<T_FINDING> Findings() const;
-    int CheckData() override;
+    std::vector<T_FINDING> Findings() const override;
     static void CurveFindings(const T_SKEL_EC8& curve, const T_PLACE& place,
                               std::vector<T_FINDING>& out);
 

@@ -79,7 +79,8 @@ B BackboneOf(const T_SKEL_FEMA& f, const T_SIDES<T_SKEL_SIDE>& s)
 {
     return {s.pos,           s.neg,           f.symmetric,
             f.strengthLoss,  f.autoYield,     f.measure == SKEL_MEASURE::DDy,
-            f.initStiffness, f.asymStiffness, &f};
+            f.initStiffness, f.asymStiffness, &f,
+            f.compliance};
 }
 
 constexpr T_RULE_HEAD kCount{"IDS_RPS_MULTI_CURVE_COUNT", kLit, nullptr, nullptr, "curves"};
@@ -122,6 +123,18 @@ void ConvertCurve(T_SKEL_FEMA& curve, SKEL_MEASURE to)
 std::size_t Index(HINGE_COMPONENT c)
 {
     return static_cast<std::size_t>(c);
+}
+
+/// A value of the curve's own sides and of those of every axial force.
+void SetOnAllSides(T_SKEL_FEMA& curve, double T_SKEL_SIDE::*member, const T_SIDES<double>& value)
+{
+    const auto set = [&](T_SIDES<T_SKEL_SIDE>& s) {
+        s.pos.*member = value.pos;
+        s.neg.*member = value.neg;
+    };
+    set(curve.sides);
+    for (T_SKEL_AXIAL& a : curve.curves)
+        set(a.sides);
 }
 
 const T_SKEL_AXIAL* CurveOfForce(const T_SKEL_FEMA& f, double axial)
@@ -174,14 +187,6 @@ std::vector<T_FINDING> CPO_HingeSkcvTabFemaDlg::Findings() const
         });
     }
     return out;
-}
-
-int CPO_HingeSkcvTabFemaDlg::CheckData()
-{
-    const std::vector<T_FINDING> found = Findings();
-    if (found.empty()) return 1;
-    ShowMessage(found.front().messageKey, found.front().text);
-    return 0;
 }
 
 void CPO_HingeSkcvTabFemaDlg::CurveFindings(const T_SKEL_FEMA& curve, T_PLACE place,
@@ -279,28 +284,28 @@ void CPO_HingeSkcvTabFemaDlg::SetAutoCalcValue(HINGE_COMPONENT c, HINGE_END end,
                                                const T_SIDES<double>& yield)
 {
     T_SKEL_FEMA* curve = Curve(c, end);
-    if (!curve || !curve->autoYield) return;
-    const auto set = [&](T_SIDES<T_SKEL_SIDE>& s) {
-        s.pos.yield = yield.pos;
-        s.neg.yield = yield.neg;
-    };
-    set(curve->sides);
-    for (T_SKEL_AXIAL& a : curve->curves)
-        set(a.sides);
+    if (curve && curve->autoYield) SetOnAllSides(*curve, &T_SKEL_SIDE::yield, yield);
 }
 
 void CPO_HingeSkcvTabFemaDlg::SetYieldDeform(HINGE_COMPONENT c, HINGE_END end,
                                              const T_SIDES<double>& deform)
 {
+    if (T_SKEL_FEMA* curve = Curve(c, end))
+        SetOnAllSides(*curve, &T_SKEL_SIDE::yieldDeform, deform);
+}
+
+int CPO_HingeSkcvTabFemaDlg::OnComplianceChk(HINGE_COMPONENT c, HINGE_END end, bool on)
+{
     T_SKEL_FEMA* curve = Curve(c, end);
-    if (!curve) return;
-    const auto set = [&](T_SIDES<T_SKEL_SIDE>& s) {
-        s.pos.yieldDeform = deform.pos;
-        s.neg.yieldDeform = deform.neg;
-    };
-    set(curve->sides);
-    for (T_SKEL_AXIAL& a : curve->curves)
-        set(a.sides);
+    if (!curve) return 0;
+    curve->compliance = on;
+    return 1;
+}
+
+std::string CPO_HingeSkcvTabFemaDlg::CriterionText(const T_SKEL_FEMA& curve, double value)
+{
+    return curve.compliance ? ShortestText(value)
+                            : zql::lib::MMSGFunction::GetValue("IDS_RPS_PO_FEMA_Inactive");
 }
 
 bool CPO_HingeSkcvTabFemaDlg::IsInfillStrutMode(HINGE_COMPONENT c, HINGE_END end)

@@ -6,14 +6,13 @@
 // all that it has. Nothing leaves the editor before CheckData passes.
 #pragma once
 
-#include "qm_base/mdialog.h"
-#include "qm_rps/hingefindings.h"
+#include "qm_rps/hingedialog.h"
 
 #include <array>
 #include <optional>
 #include <vector>
 
-class CPO_HingeSkcvTabFemaDlg : public zql::frx::MDialog {
+class CPO_HingeSkcvTabFemaDlg : public CHingeDialog {
 public:
     using T_ROW = std::array<double, 9>; // -E, -D, -C, -B, A, B, C, D, E
 
@@ -28,8 +27,7 @@ public:
     T_SKEL_FEMA* Curve(HINGE_COMPONENT c, HINGE_END end);
 
     /// Every rule that is not kept; CheckData shows the first one.
-    std::vector<T_FINDING> Findings() const;
-    int CheckData() override;
+    std::vector<T_FINDING> Findings() const override;
     /// The rules of one curve.
     static void CurveFindings(const T_SKEL_FEMA& curve, T_PLACE place, std::vector<T_FINDING>& out);
 
@@ -69,6 +67,12 @@ public:
     void SetAutoCalcValue(HINGE_COMPONENT c, HINGE_END end, const T_SIDES<double>& yield);
     /// Yield deformations of both sides, magnitudes.
     void SetYieldDeform(HINGE_COMPONENT c, HINGE_END end, const T_SIDES<double>& deform);
+
+    /// The switch "IDS_RPS_PO_FEMA_Compliance_Criteria". Off: the criteria keep their values, but
+    /// are not checked and shown as inactive. 0: no such page.
+    [[nodiscard]] int OnComplianceChk(HINGE_COMPONENT c, HINGE_END end, bool on);
+    /// A criterion as shown.
+    static std::string CriterionText(const T_SKEL_FEMA& curve, double value);
 
     /// Infill panel as a strut: the curve has its own labels.
     bool IsInfillStrutMode(HINGE_COMPONENT c, HINGE_END end);

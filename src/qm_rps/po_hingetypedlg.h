@@ -1,27 +1,14 @@
 // Model of the hinge type editor: choices that are offered together, one curve editor per
-// component, and the check of the whole type before it is stored.
+// component, the editors of the type's other parts, and the check of the whole type before it is
+// stored.
 #pragma once
 
-#include "qm_base/mdialog.h"
-#include "qm_rps/hingefindings.h"
+#include "qm_rps/hingecontext.h"
+#include "qm_rps/hingedialog.h"
 
 #include <functional>
 
-/// What a hinge type is judged against besides itself.
-struct T_HINGE_CONTEXT {
-    bool altHysteresis = false; // alternative hysteresis models are in use
-    bool strengthDegradation = false;
-    bool gsd = false;        // section-based curves are switched on ...
-    bool gsdAllowed = false; // ... and the product allows them
-    std::string concreteCode, steelCode;
-    /// Section and material of a key, null where there is none; unset: references are not checked.
-    std::function<const T_SECT_D*(int key)> section;
-    std::function<const T_MATL_D*(int key)> material;
-    /// Adds what the yield surface and the user interaction curves do not keep; may be unset.
-    std::function<void(const T_PHGT_D&, std::vector<T_FINDING>&)> interactionFindings;
-};
-
-class CPO_HingeTypeDlg : public zql::frx::MDialog {
+class CPO_HingeTypeDlg : public CHingeDialog {
 public:
     struct T_SKCV_ENTRY {
         const char* key; // of its text
@@ -29,32 +16,109 @@ public:
         bool enabled = true;
         bool operator==(const T_SKCV_ENTRY&) const = default;
     };
+    /// A section that the type can refer to.
+    struct T_REF_ENTRY {
+        int key = 0;
+        std::string text; // "3 : wall 30"
+        bool operator==(const T_REF_ENTRY&) const = default;
+    };
+    using T_REF_LIST = std::vector<T_REF_ENTRY>;
     using T_LENGTH_STATE = std::array<T_ENDS<bool>, 6>;
+    /// Initial stiffness of a page of a component; empty where its data are missing.
+    struct T_STIFFNESS_ROW {
+        HINGE_COMPONENT component = HINGE_COMPONENT::Fx;
+        HINGE_END end = HINGE_END::Both;
+        INIT_STIFFNESS option = INIT_STIFFNESS::EI6L;
+        T_SIDES<std::optional<double>> stiffness;
+    };
+    /// Parts of the editor besides the components' rows.
+    enum class PART {
+        Interaction,     // of My and Mz
+        YieldSurface,    // OnYieldSurfaceDlgDlg
+        UserInteraction, // P-M curves of the user
+        Section,         // InitPropCombo_Sect, under "IDS_CMD_IEHP_SECT_TXT"
+        Thickness,       // InitPropCombo_Thik, under "IDS_CMD_IEHP_THIK_TXT"
+        FibreFrame,      // InitFiberCombo_Fibr
+        FibreWall,       // InitFiberCombo_Fibw
+        IntegrationPoints,
+        HingeLength,
+        Location,
+        Masonry,
+        InfillStrut, // choice of the strut form in Fx
+        Count
+    };
+    struct T_PART_STATE {
+        bool shown = false, enabled = false;
+        bool operator==(const T_PART_STATE&) const = default;
+    };
+    using T_MODE = std::array<T_PART_STATE, static_cast<std::size_t>(PART::Count)>;
 
     explicit CPO_HingeTypeDlg(T_HINGE_CONTEXT context);
+
+    /// Writes the record to the document. 1 stored; 0 not. Unset: OnApply refuses.
+    std::function<int(const T_PHGT_D&)> m_store;
 
     /// Takes the record. A component whose curve type is not offered gets the first that is.
     void Data2Dlg(const T_PHGT_D& data);
     /// Checks, then writes the whole record. 0: `data` as it was.
     [[nodiscard]] int Dlg2Data(T_PHGT_D& data);
+    /// Checks and stores; a warning (HingeTypeWarnings) is shown and goes on. 0: a finding was
+    /// shown, or the document refused.
+    [[nodiscard]] int OnApply();
+    int OnOK() override { return OnApply(); }
+    /// The document has changed: options, codes and sections are read again, lists filled again.
+    void OnUpdate(T_HINGE_CONTEXT context);
+
     const T_PHGT_D& Type() const { return m_type; }
     void SetName(const std::string& name) { m_type.name = name; }
     void SetSection(int section, int material);
+    void SetFibreSection(int section) { m_type.fibreSection = section; }
+    void SetThicknessSection(int section) { m_type.thicknessSection = section; }
     T_HINGE_LENGTH& Length() { return m_type.length; }
     void SetMasonry(const std::optional<T_MASONRY_HINGE>& masonry) { m_type.masonry = masonry; }
 
     /// Curve types that a component of such a type offers, in their order.
     static std::vector<T_SKCV_ENTRY> CustomizeSkcvCmb(const T_PHGT_D& type, HINGE_COMPONENT c,
                                                       const T_HINGE_CONTEXT& context);
+    /// Key of the text of a curve type; a code outside the list is shown as an error.
+    static const char* SkcvKey(SKEL_TYPE code);
     /// Position in its list of the component's curve type.
     int SelectedSkcv(HINGE_COMPONENT c) const;
     /// Keys of the materials of a strength calculation that fit the material class.
     static std::vector<const char*> InitComboByMaterialType(MATL_CLASS material);
 
+    // Sections of the document. Fibres of frames: any with dimensions. Fibres of walls, wall
+    // sections and thicknesses: rectangles; the thickness (text "2 : 0.3") is the smaller side.
+    T_REF_LIST InitFiberCombo_Fibr() const;
+    T_REF_LIST InitFiberCombo_Fibw() const;
+    T_REF_LIST InitPropCombo_Sect() const;
+    T_REF_LIST InitPropCombo_Thik() const;
+
+    /// Which parts are shown, and which of these can be used, for the element type, definition,
+    /// material class, interaction and components.
+    T_MODE CustomizeDlgByMode() const;
+    /// Degrees of freedom that the element type has: a truss Fx alone, others all.
+    static bool HasComponent(HINGE_ELEMENT element, HINGE_COMPONENT c);
+
+    /// "Moment - Rotation (M-%s)", "Moment - Curvature (M-%s Lumped)" or "... Distributed)" with
+    /// the component's rotation symbol Rx, Ry or Rz; empty for a force.
+    static std::string HingeModelLabel(HINGE_DEFINITION definition, HINGE_COMPONENT c);
+
+    /// A row per page of the active components, from section and material of the type and the span
+    /// that the type gives, else `memberLength`.
+    std::vector<T_STIFFNESS_ROW> UpdateInitialStiffness(double memberLength) const;
+
     // What changes the lists of curve types fills them again.
     void OnSelChangeElement(HINGE_ELEMENT element);
     void OnSelChangeDefinition(HINGE_DEFINITION definition);
     void OnSelChangeMaterial(MATL_CLASS material);
+
+    /// Puts the component back to its defaults, active or not as it was: the first curve type that
+    /// is offered, 6EI/L for bending and the elastic stiffness else, Fx and Mx at the centre
+    /// (links, springs and trusses all), the others at both ends.
+    void InitDataByDof(HINGE_COMPONENT c);
+    /// The same for every active component.
+    void InitDataCheckedAll();
 
     void OnComponentCtrl(HINGE_COMPONENT c, bool active);
     void OnLocationCtrl(HINGE_COMPONENT c, HINGE_LOCATION location);
@@ -63,8 +127,15 @@ public:
     /// Chooses the entry at that position. 0: none there or disabled, nothing changed. A curve of
     /// another family starts from its defaults.
     [[nodiscard]] int OnSelChangeSkcv(HINGE_COMPONENT c, int index);
-    /// Opens the editor of the component's curve in the view. 1 accepted and taken; 0 not.
+
+    // Open an editor in the view. 1 accepted and taken; 0 not.
     [[nodiscard]] int OnBtnSkcvProp(HINGE_COMPONENT c);
+    [[nodiscard]] int OnYieldSurfaceDlgDlg();
+    [[nodiscard]] int OnUserInteractionDlg();
+    [[nodiscard]] int OnMasonryPropDlg();
+    [[nodiscard]] int OnBtnIntegrationPoint();
+    /// Moment-rotation or moment-curvature lengths, by the definition.
+    [[nodiscard]] int OnBtnHingeLength();
 
     /// The bending components offer these interactions, in this order; My and Mz share one.
     static constexpr std::array<HINGE_INTERACTION, 4> kBendingInteractions{
@@ -75,22 +146,26 @@ public:
     /// Record code to position; -1 for one that bending does not offer.
     static int ConvertInteraction(HINGE_INTERACTION code);
     [[nodiscard]] int OnSelChangeInteraction(int index);
+    /// The curve type that fixes the levels of the yield surface: that of My, else of Mz.
+    static SKEL_TYPE YieldSurfaceCurve(const T_PHGT_D& type);
 
     /// Which components need a hinge length at the I-end and the J-end.
     static T_LENGTH_STATE GetHingeLengthEnableState(const T_PHGT_D& type, bool altHysteresis);
     static const char* HingeLengthCaptionKey(bool altHysteresis);
     bool IsHingeLengthEnabled() const;
+    /// Lengths of a component at the ends that need one, "I 0.3, J 0.25"; empty where none does.
+    std::string GetHingeLength_MTheta(HINGE_COMPONENT c) const; // My and Mz alone
+    std::string GetHingeLength_MPhi(HINGE_COMPONENT c) const;
 
-    /// Everything that a type does not keep: name, references, curves of all active components and
-    /// ends, masonry, interaction. CheckData shows the first.
+    /// See HingeTypeFindings. CheckData shows the first.
     static std::vector<T_FINDING> TypeFindings(const T_PHGT_D& type,
                                                const T_HINGE_CONTEXT& context);
-    std::vector<T_FINDING> Findings() const { return TypeFindings(m_type, m_context); }
-    int CheckData() override;
+    std::vector<T_FINDING> Findings() const override { return TypeFindings(m_type, m_context); }
 
 private:
     T_HINGE_COMPONENT& At(HINGE_COMPONENT c);
     void RefillSkcv();
+    std::string LengthText(HINGE_COMPONENT c, const T_ENDS<double>& length) const;
 
     T_HINGE_CONTEXT m_context;
     T_PHGT_D m_type;

@@ -45,15 +45,20 @@ std::string CPO_HingeTypeListDlg::NameOf(int key, const std::string& name)
     return std::to_string(key) + " : " + name;
 }
 
+std::optional<zql::frx::T_MESSAGE> CPO_HingeTypeListDlg::ChoiceFault(int key, bool exists)
+{
+    constexpr const char* none = "IDS_PUSHOVER_No_selected_Hinge_Data_Type__nChoose_o";
+    constexpr const char* gone = "IDS_PUSHOVER_Hinge_Data_Type_key__d_does_not_exits_";
+    if (key == 0) return zql::frx::T_MESSAGE{none, MMSGFunction::GetValue(none)};
+    if (exists) return std::nullopt;
+    return zql::frx::T_MESSAGE{gone, MMSGFunction::Format(gone, {std::to_string(key)})};
+}
+
 int CPO_HingeTypeListDlg::CheckData()
 {
-    if (m_selected == 0) {
-        ShowMessage("IDS_PUSHOVER_No_selected_Hinge_Data_Type__nChoose_o");
-        return 0;
-    }
-    if (m_access.types().count(m_selected)) return 1;
-    constexpr const char* gone = "IDS_PUSHOVER_Hinge_Data_Type_key__d_does_not_exits_";
-    ShowMessage(gone, MMSGFunction::Format(gone, {std::to_string(m_selected)}));
+    const auto fault = ChoiceFault(m_selected, m_access.types().contains(m_selected));
+    if (!fault) return 1;
+    ShowMessage(fault->key, fault->text);
     return 0;
 }
 

@@ -6,6 +6,7 @@
 #include "qm_db/records.h"
 
 #include <functional>
+#include <optional>
 
 /// How the list reaches the document.
 struct T_HINGE_LIST_ACCESS {
@@ -32,6 +33,9 @@ public:
     static std::string DataToStr(HINGE_ELEMENT element);
     /// "%d : %s"
     static std::string NameOf(int key, const std::string& name);
+
+    /// The message for a chosen key: none chosen (0), or no such type; none where all is well.
+    static std::optional<zql::frx::T_MESSAGE> ChoiceFault(int key, bool exists);
 
     /// Key of the chosen type; 0: none.
     int m_selected = 0;

@@ -1,7 +1,6 @@
 #include "qm_rps/po_hingeyieldpropdlgnew.h"
 
-#include "qm_base/msgfunction.h"
-#include "qm_base/textformat.h"
+#include "qm_rps/hingesiderules.h"
 #include "qm_rps/po_hingeyieldpropgrid.h"
 
 #include <algorithm>
@@ -10,106 +9,111 @@
 
 namespace {
 
-constexpr const char* kMessage = "IDS_CMD_IEHP_YIELD";
+constexpr const char* kMsg = "IDS_CMD_IEHP_YIELD";
+constexpr auto kLit = RULE_TEXT::Literal;
+constexpr auto kPos = HINGE_SIDE::Positive;
+constexpr auto kNeg = HINGE_SIDE::Negative;
 constexpr int kMy = static_cast<int>(HINGE_COMPONENT::My);
 constexpr int kMz = static_cast<int>(HINGE_COMPONENT::Mz);
 
-using T_LEVEL = T_YIELD_LEVEL;
+using L = T_YIELD_LEVEL;
 
-/// A strength or moment of a level. component: the axis it belongs to, -1 for both.
-struct T_PARAMETER {
-    const char* field;
-    int component;
-    HINGE_SIDE side;
-    double (*value)(const T_LEVEL&);
-};
+bool UsesY(const L& l)
+{
+    return l.y.used;
+}
+bool UsesZ(const L& l)
+{
+    return l.z.used;
+}
+template <double T_YIELD_LEVEL::*FORCE>
+bool ForceAbove0(const L& l)
+{
+    return Below(0, l.*FORCE);
+}
+/// A moment of an axis: of (+) or (-), MY or the largest one.
+template <T_YIELD_AXIS T_YIELD_LEVEL::*AXIS, T_SIDES<double> T_YIELD_AXIS::*WHAT, bool POS>
+bool MomentAbove0(const L& l)
+{
+    const T_SIDES<double>& m = l.*AXIS.*WHAT;
+    return Below(0, POS ? m.pos : m.neg);
+}
+constexpr auto kTension = ForceAbove0<&L::tension>;
+constexpr auto kPmax = ForceAbove0<&L::compression>;
+constexpr auto kYPos = MomentAbove0<&L::y, &T_YIELD_AXIS::moment, true>;
+constexpr auto kYNeg = MomentAbove0<&L::y, &T_YIELD_AXIS::moment, false>;
+constexpr auto kZPos = MomentAbove0<&L::z, &T_YIELD_AXIS::moment, true>;
+constexpr auto kZNeg = MomentAbove0<&L::z, &T_YIELD_AXIS::moment, false>;
+constexpr auto kYMaxPos = MomentAbove0<&L::y, &T_YIELD_AXIS::momentMax, true>;
+constexpr auto kYMaxNeg = MomentAbove0<&L::y, &T_YIELD_AXIS::momentMax, false>;
+constexpr auto kZMaxPos = MomentAbove0<&L::z, &T_YIELD_AXIS::momentMax, true>;
+constexpr auto kZMaxNeg = MomentAbove0<&L::z, &T_YIELD_AXIS::momentMax, false>;
 
-enum PARAMETER {
-    kTension,
-    kPmax,
-    kYPos,
-    kZPos,
-    kYNeg,
-    kZNeg,
-    kYMaxPos,
-    kZMaxPos,
-    kYMaxNeg,
-    kZMaxNeg
-};
+/// Head of the rule of a moment of the component's axis.
+constexpr T_RULE_HEAD Of(int component, const char* text, const char* field, HINGE_SIDE side)
+{
+    return {kMsg, kLit, text, nullptr, field, side, "", "", nullptr, "", "", component};
+}
 
 // clang-format off
-constexpr T_PARAMETER kParameters[] = { // by PARAMETER
-    {"tension",         -1,  HINGE_SIDE::None,     [](const T_LEVEL& l) { return l.tension; }},
-    {"compression",     -1,  HINGE_SIDE::None,     [](const T_LEVEL& l) { return l.compression; }},
-    {"y.moment.pos",    kMy, HINGE_SIDE::Positive, [](const T_LEVEL& l) { return l.y.moment.pos; }},
-    {"z.moment.pos",    kMz, HINGE_SIDE::Positive, [](const T_LEVEL& l) { return l.z.moment.pos; }},
-    {"y.moment.neg",    kMy, HINGE_SIDE::Negative, [](const T_LEVEL& l) { return l.y.moment.neg; }},
-    {"z.moment.neg",    kMz, HINGE_SIDE::Negative, [](const T_LEVEL& l) { return l.z.moment.neg; }},
-    {"y.momentMax.pos", kMy, HINGE_SIDE::Positive, [](const T_LEVEL& l) { return l.y.momentMax.pos; }},
-    {"z.momentMax.pos", kMz, HINGE_SIDE::Positive, [](const T_LEVEL& l) { return l.z.momentMax.pos; }},
-    {"y.momentMax.neg", kMy, HINGE_SIDE::Negative, [](const T_LEVEL& l) { return l.y.momentMax.neg; }},
-    {"z.momentMax.neg", kMz, HINGE_SIDE::Negative, [](const T_LEVEL& l) { return l.z.momentMax.neg; }},
+const T_RULE<L> kCrackRules[] = {
+    {{kMsg, kLit, "PC(t) > 0", nullptr, "tension"}, kTension},
+    {{kMsg, kLit, "Pmax(c) > 0", nullptr, "compression"}, kPmax},
+    {Of(kMy, "MCy(+) > 0", "y.moment.pos", kPos), kYPos, UsesY},
+    {Of(kMz, "MCz(+) > 0", "z.moment.pos", kPos), kZPos, UsesZ},
+    {Of(kMy, "MCy(-) > 0", "y.moment.neg", kNeg), kYNeg, UsesY},
+    {Of(kMz, "MCz(-) > 0", "z.moment.neg", kNeg), kZNeg, UsesZ},
+    {Of(kMy, "MYy,max(+) > 0", "y.momentMax.pos", kPos), kYMaxPos, UsesY},
+    {Of(kMz, "MYz,max(+) > 0", "z.momentMax.pos", kPos), kZMaxPos, UsesZ},
+    {Of(kMy, "MYy,max(-) > 0", "y.momentMax.neg", kNeg), kYMaxNeg, UsesY},
+    {Of(kMz, "MYz,max(-) > 0", "z.momentMax.neg", kNeg), kZMaxNeg, UsesZ},
+};
+const T_RULE<L> kYieldRules[] = {
+    {{kMsg, kLit, "PY(t) > 0", nullptr, "tension"}, kTension},
+    {{kMsg, kLit, "Pmax(c) > 0", nullptr, "compression"}, kPmax},
+    {Of(kMy, "MYy(+) > 0", "y.moment.pos", kPos), kYPos, UsesY},
+    {Of(kMz, "MYz(+) > 0", "z.moment.pos", kPos), kZPos, UsesZ},
+    {Of(kMy, "MYy(-) > 0", "y.moment.neg", kNeg), kYNeg, UsesY},
+    {Of(kMz, "MYz(-) > 0", "z.moment.neg", kNeg), kZNeg, UsesZ},
+    {Of(kMy, "MUy,max(+) > 0", "y.momentMax.pos", kPos), kYMaxPos, UsesY},
+    {Of(kMz, "MUz,max(+) > 0", "z.momentMax.pos", kPos), kZMaxPos, UsesZ},
+    {Of(kMy, "MUy,max(-) > 0", "y.momentMax.neg", kNeg), kYMaxNeg, UsesY},
+    {Of(kMz, "MUz,max(-) > 0", "z.momentMax.neg", kNeg), kZMaxNeg, UsesZ},
+};
+const T_RULE<L> kEc8Rules[] = {
+    {{kMsg, kLit, "PC0(t) > 0", nullptr, "tension"}, kTension},
+    {{kMsg, kLit, "Pmax(c) > 0", nullptr, "compression"}, kPmax},
+    {Of(kMy, "MC0y(+) > 0", "y.moment.pos", kPos), kYPos, UsesY},
+    {Of(kMy, "MUy,max(+) > 0", "y.momentMax.pos", kPos), kYMaxPos, UsesY},
+    {Of(kMz, "MC0z(+) > 0", "z.moment.pos", kPos), kZPos, UsesZ},
+    {Of(kMz, "MUz,max(+) > 0", "z.momentMax.pos", kPos), kZMaxPos, UsesZ},
+    {Of(kMy, "MC0y(-) > 0", "y.moment.neg", kNeg), kYNeg, UsesY},
+    {Of(kMy, "MUy,max(-) > 0", "y.momentMax.neg", kNeg), kYMaxNeg, UsesY},
+    {Of(kMz, "MC0z(-) > 0", "z.moment.neg", kNeg), kZNeg, UsesZ},
+    {Of(kMz, "MUz,max(-) > 0", "z.momentMax.neg", kNeg), kZMaxNeg, UsesZ},
 };
 
-struct T_LABEL {
-    const char* label;
-    PARAMETER parameter;
+/// A point of a curve beside the one before it on the same side of the axial force.
+struct T_POINT_CHECK {
+    const T_PM_POINT& now;
+    const T_PM_POINT* before; // null: the first
 };
-constexpr T_LABEL kCrackLabels[] = {
-    {"PC(t)", kTension}, {"Pmax(c)", kPmax},
-    {"MCy(+)", kYPos}, {"MCz(+)", kZPos}, {"MCy(-)", kYNeg}, {"MCz(-)", kZNeg},
-    {"MYy,max(+)", kYMaxPos}, {"MYz,max(+)", kZMaxPos},
-    {"MYy,max(-)", kYMaxNeg}, {"MYz,max(-)", kZMaxNeg},
-};
-constexpr T_LABEL kYieldLabels[] = {
-    {"PY(t)", kTension}, {"Pmax(c)", kPmax},
-    {"MYy(+)", kYPos}, {"MYz(+)", kZPos}, {"MYy(-)", kYNeg}, {"MYz(-)", kZNeg},
-    {"MUy,max(+)", kYMaxPos}, {"MUz,max(+)", kZMaxPos},
-    {"MUy,max(-)", kYMaxNeg}, {"MUz,max(-)", kZMaxNeg},
-};
-constexpr T_LABEL kEc8Labels[] = {
-    {"PC0(t)", kTension}, {"Pmax(c)", kPmax},
-    {"MC0y(+)", kYPos}, {"MUy,max(+)", kYMaxPos}, {"MC0z(+)", kZPos}, {"MUz,max(+)", kZMaxPos},
-    {"MC0y(-)", kYNeg}, {"MUy,max(-)", kYMaxNeg}, {"MC0z(-)", kZNeg}, {"MUz,max(-)", kZMaxNeg},
-};
+using P = T_POINT_CHECK;
+
+bool RatioInside(const P& c) { return Below(-1, c.now.m) && Below(c.now.m, 1); }
+bool Falls(const P& c) { return c.before ? Below(c.now.p, c.before->p) : std::isfinite(c.now.p); }
+const T_RULE<P> kRatioPos[] = {{{kMsg, kLit, "-1 < M/MY,max(+) < 1", nullptr, "m", kPos}, RatioInside}};
+const T_RULE<P> kRatioNeg[] = {{{kMsg, kLit, "-1 < M/MY,max(-) < 1", nullptr, "m", kNeg}, RatioInside}};
+const T_RULE<P> kFallTension[] = {{{kMsg, kLit, "P/Pmax(t)", nullptr, "p"}, Falls}};
+const T_RULE<P> kFallCompression[] = {{{kMsg, kLit, "P/Pmax(c)", nullptr, "p"}, Falls}};
 // clang-format on
 
-/// A level with its name in the record and its labels.
+/// A level with its name in the record and the rules of its strengths.
 struct T_LEVEL_VIEW {
-    std::string name;
-    const T_LEVEL* level;
-    std::span<const T_LABEL> labels;
+    const char* prefix;
+    const T_YIELD_LEVEL* level;
+    std::span<const T_RULE<L>> rules;
 };
-
-bool Used(const T_LEVEL& level, int component)
-{
-    return component == kMy ? level.y.used : component == kMz ? level.z.used : true;
-}
-
-T_FINDING Finding(std::string field, std::string rule, int component, HINGE_SIDE side,
-                  const char* point)
-{
-    T_FINDING f;
-    f.field = std::move(field);
-    f.text = zql::lib::MMSGFunction::Format(kMessage, {rule});
-    f.ruleText = std::move(rule);
-    f.messageKey = kMessage;
-    f.component = component;
-    f.side = side;
-    f.point = point;
-    return f;
-}
-
-void CheckParameters(const T_LEVEL_VIEW& view, std::vector<T_FINDING>& out)
-{
-    for (const T_LABEL& row : view.labels) {
-        const T_PARAMETER& p = kParameters[row.parameter];
-        const double value = p.value(*view.level);
-        if (!Used(*view.level, p.component) || (value > 0.0 && std::isfinite(value))) continue;
-        out.push_back(Finding(view.name + "." + p.field, std::string(row.label) + " > 0",
-                              p.component, p.side, ""));
-    }
-}
 
 /// A curve of a used axis.
 struct T_CURVE_VIEW {
@@ -123,55 +127,41 @@ std::vector<T_CURVE_VIEW> CurvesOf(const T_LEVEL_VIEW& view)
 {
     std::vector<T_CURVE_VIEW> out;
     for (const int c : {kMy, kMz}) {
-        if (!Used(*view.level, c)) continue;
         const T_YIELD_AXIS& axis = c == kMy ? view.level->y : view.level->z;
-        const std::string field = view.name + (c == kMy ? ".y" : ".z") + ".curves.";
-        out.push_back({field + "pos", &axis.curves.pos, c, HINGE_SIDE::Positive});
-        out.push_back({field + "neg", &axis.curves.neg, c, HINGE_SIDE::Negative});
+        if (!axis.used) continue;
+        const std::string field = std::string(view.prefix) + (c == kMy ? "y" : "z") + ".curves.";
+        out.push_back({field + "pos", &axis.curves.pos, c, kPos});
+        out.push_back({field + "neg", &axis.curves.neg, c, kNeg});
     }
     return out;
 }
 
-std::string PointField(const T_CURVE_VIEW& v, std::size_t i, char what)
+/// One rule on the points first ... first + count - 1 of a curve.
+void WalkPoints(std::span<const T_RULE<P>> rules, const T_CURVE_VIEW& v, std::size_t first,
+                std::size_t count, std::vector<T_FINDING>& out)
 {
-    return v.field + FormatText("[%zu].%c", i, what);
-}
-
-/// The ratios of one axis, point by point, (+) before (-).
-void CheckRatios(const T_CURVE_VIEW& pos, const T_CURVE_VIEW& neg, std::vector<T_FINDING>& out)
-{
-    for (std::size_t i = 0; i < kPmPointNames.size(); ++i)
-        for (const T_CURVE_VIEW* v : {&pos, &neg}) {
-            const double m = (*v->curve)[i].m;
-            if (m > -1.0 && m < 1.0) continue;
-            const bool plus = v->side == HINGE_SIDE::Positive;
-            out.push_back(Finding(PointField(*v, i, 'm'),
-                                  plus ? "-1 < M/MY,max(+) < 1" : "-1 < M/MY,max(-) < 1",
-                                  v->component, v->side, kPmPointNames[i]));
-        }
-}
-
-/// P/Pmax falls strictly along the points first ... first + 4, and is finite.
-void CheckFall(const T_CURVE_VIEW& v, std::size_t first, const char* rule,
-               std::vector<T_FINDING>& out)
-{
-    for (std::size_t i = first; i < first + 5; ++i) {
-        const double p = (*v.curve)[i].p;
-        if (std::isfinite(p) && (i == first || p < (*v.curve)[i - 1].p)) continue;
-        out.push_back(Finding(PointField(v, i, 'p'), rule, v.component, v.side, kPmPointNames[i]));
+    for (std::size_t i = first; i < first + count; ++i) {
+        const P check{(*v.curve)[i], i == first ? nullptr : &(*v.curve)[i - 1]};
+        const std::size_t found = out.size();
+        WalkRules(rules, check,
+                  {v.component, HINGE_END::Both, -1, v.field + "[" + std::to_string(i) + "].",
+                   kPmPointNames[i]},
+                  out);
+        for (std::size_t k = found; k < out.size(); ++k)
+            out[k].side = v.side;
     }
 }
 
 /// The levels of a curve type; `missing` stands in for a crack level that is not there.
-std::vector<T_LEVEL_VIEW> LevelsOf(const T_YIELD_SURFACE& s, SKEL_TYPE type, T_LEVEL& missing)
+std::vector<T_LEVEL_VIEW> LevelsOf(const T_YIELD_SURFACE& s, SKEL_TYPE type, T_YIELD_LEVEL& missing)
 {
     missing.y.used = s.yield.y.used;
     missing.z.used = s.yield.z.used;
-    if (type == SKEL_TYPE::Ec8) return {{"yield", &s.yield, kEc8Labels}};
+    if (type == SKEL_TYPE::Ec8) return {{"yield.", &s.yield, kEc8Rules}};
     std::vector<T_LEVEL_VIEW> out;
     if (type == SKEL_TYPE::Trilinear || type == SKEL_TYPE::SlipTrilinear)
-        out.push_back({"crack", s.crack ? &*s.crack : &missing, kCrackLabels});
-    out.push_back({"yield", &s.yield, kYieldLabels});
+        out.push_back({"crack.", s.crack ? &*s.crack : &missing, kCrackRules});
+    out.push_back({"yield.", &s.yield, kYieldRules});
     return out;
 }
 
@@ -183,25 +173,20 @@ std::vector<T_FINDING> CPO_HingeYieldPropDlgNew::Findings() const
     std::vector<T_CURVE_VIEW> curves;
     T_YIELD_LEVEL missing;
     for (const T_LEVEL_VIEW& view : LevelsOf(m_surface, m_type, missing)) {
-        CheckParameters(view, out);
+        WalkRules(view.rules, *view.level, {-1, HINGE_END::Both, -1, view.prefix}, out);
         for (T_CURVE_VIEW& c : CurvesOf(view))
             curves.push_back(std::move(c));
     }
     for (std::size_t i = 0; i < curves.size(); i += 2)
-        CheckRatios(curves[i], curves[i + 1], out);
+        for (std::size_t p = 0; p < kPmPointNames.size(); ++p) {
+            WalkPoints(kRatioPos, curves[i], p, 1, out);
+            WalkPoints(kRatioNeg, curves[i + 1], p, 1, out);
+        }
     for (const T_CURVE_VIEW& c : curves) {
-        CheckFall(c, 5, "P/Pmax(t)", out);
-        CheckFall(c, 0, "P/Pmax(c)", out);
+        WalkPoints(kFallTension, c, 5, 5, out);
+        WalkPoints(kFallCompression, c, 0, 5, out);
     }
     return out;
-}
-
-int CPO_HingeYieldPropDlgNew::CheckData()
-{
-    const std::vector<T_FINDING> findings = Findings();
-    if (findings.empty()) return 1;
-    ShowMessage(findings.front().messageKey, findings.front().text);
-    return 0;
 }
 
 int CPO_HingeYieldPropDlgNew::OnOK()

@@ -1,11 +1,10 @@
 // Model of the editor of a hinge type's yield surface.
 #pragma once
 
-#include "qm_base/mdialog.h"
 #include "qm_db/hingerecords.h"
-#include "qm_rps/hingefindings.h"
+#include "qm_rps/hingedialog.h"
 
-class CPO_HingeYieldPropDlgNew : public zql::frx::MDialog {
+class CPO_HingeYieldPropDlgNew : public CHingeDialog {
 public:
     /// The normaliser of the moments of an Eurocode surface, as shown.
     static constexpr const char* kMomentNormaliserText =
@@ -27,9 +26,8 @@ public:
     /// the axial strengths belong to both axes and are always checked), then for each point
     /// -1 < M/MY,max < 1 of (+) and (-), then along each curve P/Pmax falling on the tension side
     /// and on the compression side. An axis that is not used is not checked. A NaN fails its rule.
-    std::vector<T_FINDING> Findings() const;
-    /// Shows the first finding under IDS_CMD_IEHP_YIELD.
-    int CheckData() override;
+    /// They are reported under IDS_CMD_IEHP_YIELD.
+    std::vector<T_FINDING> Findings() const override;
     /// 1 and the record holds the surface; 0 and the record is unchanged.
     int OnOK() override;
 

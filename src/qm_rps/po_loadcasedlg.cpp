@@ -126,14 +126,6 @@ std::vector<T_FINDING> CPO_LoadCaseDlg::Findings() const
     return out;
 }
 
-int CPO_LoadCaseDlg::CheckData()
-{
-    const std::vector<T_FINDING> found = Findings();
-    if (found.empty()) return 1;
-    ShowMessage(found.front().messageKey, found.front().text);
-    return 0;
-}
-
 std::vector<T_FINDING> CPO_LoadCaseDlg::PatternFindings(const std::vector<T_POLC_PATTERN>& rows)
 {
     std::vector<T_FINDING> out;

@@ -2,13 +2,12 @@
 // Lengths in the caller's units, angles in degrees. One class serves both dialogs of load cases.
 #pragma once
 
-#include "qm_base/mdialog.h"
 #include "qm_db/records.h"
-#include "qm_rps/hingefindings.h"
+#include "qm_rps/hingedialog.h"
 
 #include <functional>
 
-class CPO_LoadCaseDlg : public zql::frx::MDialog {
+class CPO_LoadCaseDlg : public CHingeDialog {
 public:
     /// What is chosen and typed for a pattern row.
     struct T_PATTERN_INPUT {
@@ -32,8 +31,7 @@ public:
     int m_selected = -1; // index of the selected pattern row
 
     /// Rules of the record that are not kept, in the order of the check; CheckData shows the first.
-    std::vector<T_FINDING> Findings() const;
-    int CheckData() override;
+    std::vector<T_FINDING> Findings() const override;
 
     /// What the row checks say of rows that are already stored.
     static std::vector<T_FINDING> PatternFindings(const std::vector<T_POLC_PATTERN>& rows);

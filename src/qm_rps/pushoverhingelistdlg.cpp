@@ -2,6 +2,7 @@
 
 #include "qm_base/appbase.h"
 #include "qm_base/msgfunction.h"
+#include "qm_rps/po_hingetypelistdlg.h"
 
 using zql::lib::MMSGFunction;
 
@@ -45,6 +46,30 @@ std::string CPushOverHingeListDlg::StrengthText(HINGE_COMPONENT c, bool crack)
                                              : "IDS_RPS_PUSHOVER_CRACK_FROCE");
     return MMSGFunction::GetValue(moment ? "IDS_RPS_PUSHOVER_YIELD_MOMENT"
                                          : "IDS_RPS_PUSHOVER_YIELD_FROCE");
+}
+
+std::vector<std::string> CPushOverHingeListDlg::Heads()
+{
+    std::vector<std::string> heads;
+    for (int c = 0; c < 6; ++c)
+        for (const bool positive : {true, false})
+            heads.push_back(ColumnHead(static_cast<HINGE_COMPONENT>(c), positive));
+    return heads;
+}
+
+std::vector<CPushOverHingeListDlg::T_ROW> CPushOverHingeListDlg::Rows(bool crack) const
+{
+    std::vector<T_ROW> rows;
+    if (!m_hinges || !m_types) return rows;
+    const T_TABLE<T_PHGT_D> types = m_types();
+    for (const auto& [key, hinge] : m_hinges()) {
+        const auto type = types.find(hinge.hingeType);
+        const std::string name =
+            type == types.end() ? MMSGFunction::GetValue("IDS_PUSHOVER_Error") : type->second.name;
+        rows.push_back({key, hinge.element, CPO_HingeTypeListDlg::NameOf(hinge.hingeType, name),
+                        crack ? hinge.crack : hinge.yield});
+    }
+    return rows;
 }
 
 int CPushOverHingeListDlg::CheckData()

@@ -6,6 +6,7 @@
 #include "qm_db/records.h"
 
 #include <functional>
+#include <vector>
 
 class CPushOverHingeListDlg : public zql::frx::MDialog {
 public:
@@ -18,7 +19,20 @@ public:
     /// Text of the strength's kind: crack or yield, force or moment.
     static std::string StrengthText(HINGE_COMPONENT c, bool crack);
 
+    /// A row of the list: strengths of one kind per component and sign.
+    struct T_ROW {
+        int key = 0, element = 0;
+        std::string type; // "2 : column"; an error text where it is gone
+        std::array<T_SIDES<double>, 6> strengths{};
+        bool operator==(const T_ROW&) const = default;
+    };
+    /// Heads of the columns of strengths: "Fx(+)", "Fx(-)" ... "Mz(-)".
+    static std::vector<std::string> Heads();
+    /// The hinges by key with their crack or yield strengths.
+    std::vector<T_ROW> Rows(bool crack) const;
+
     std::function<T_TABLE<T_PHGE_D>()> m_hinges; // all generated hinges by key
+    std::function<T_TABLE<T_PHGT_D>()> m_types;  // all hinge types by key
     int m_selected = 0;                          // key of the chosen hinge; 0: none
 
     /// The chosen hinge exists. 0 with a message otherwise.

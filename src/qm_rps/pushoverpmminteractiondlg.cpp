@@ -1,58 +1,46 @@
 #include "qm_rps/pushoverpmminteractiondlg.h"
 
-#include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/hingesiderules.h"
 
 #include <cmath>
 
 namespace {
 
-T_FINDING Finding(const char* key, std::string field, std::string rule, std::string point)
-{
-    T_FINDING f;
-    f.field = std::move(field);
-    f.ruleText = std::move(rule);
-    f.messageKey = key;
-    f.text = zql::lib::MMSGFunction::GetValue(key);
-    f.point = std::move(point);
-    return f;
-}
+constexpr const char* kCurve = "IDS_PUSHOVER_Wrong_Data_in_P_values";
+constexpr auto kLit = RULE_TEXT::Literal;
 
-/// The value does not rise from the point before; the first point must only be finite.
-bool NotRising(const double* before, double value)
-{
-    return std::isfinite(value) && (!before || value <= *before);
-}
+struct T_POINT_CHECK {
+    const T_PM_POINT& now;
+    const T_PM_POINT* before; // null: the first point, which must only be finite
+};
+using P = T_POINT_CHECK;
+
+// clang-format off
+const T_RULE<P> kPoint[] = {
+    {{kCurve, kLit, "P/Pmax", nullptr, "p"}, [](const P& c) { return c.before ? NotAbove(c.now.p, c.before->p) : std::isfinite(c.now.p); }},
+    {{kCurve, kLit, "M/Mmax", nullptr, "m"}, [](const P& c) { return c.before ? NotAbove(c.now.m, c.before->m) : std::isfinite(c.now.m); }},
+};
+const T_RULE<T_PMM_TABLE> kTable[] = {
+    {{"IDS_PUSHOVER_PMAX_POS", kLit, "Pmax >= 0", nullptr, "Pmax"}, [](const T_PMM_TABLE& t) { return NotAbove(0, t.Pmax); }},
+};
+// clang-format on
 
 } // namespace
 
 std::vector<T_FINDING> CPushOverPMMInteractionDlg::Findings() const
 {
-    constexpr const char* kCurveKey = "IDS_PUSHOVER_Wrong_Data_in_P_values";
     std::vector<T_FINDING> out;
-    for (std::size_t c = 0; c < m_table.curves.size(); ++c) {
-        const T_PM_POINT* before = nullptr;
+    for (std::size_t c = 0; c < m_table.curves.size(); ++c)
         for (std::size_t i = 0; i < m_table.curves[c].size(); ++i) {
-            const T_PM_POINT& now = m_table.curves[c][i];
-            const std::string field = FormatText("curves[%zu][%zu].", c, i);
-            if (!NotRising(before ? &before->p : nullptr, now.p))
-                out.push_back(Finding(kCurveKey, field + "p", "P/Pmax", std::to_string(i + 1)));
-            if (!NotRising(before ? &before->m : nullptr, now.m))
-                out.push_back(Finding(kCurveKey, field + "m", "M/Mmax", std::to_string(i + 1)));
-            before = &now;
+            const P check{m_table.curves[c][i], i ? &m_table.curves[c][i - 1] : nullptr};
+            WalkRules(std::span<const T_RULE<P>>(kPoint), check,
+                      {-1, HINGE_END::Both, -1, FormatText("curves[%zu][%zu].", c, i),
+                       std::to_string(i + 1)},
+                      out);
         }
-    }
-    if (!(m_table.Pmax >= 0.0) || !std::isfinite(m_table.Pmax))
-        out.push_back(Finding("IDS_PUSHOVER_PMAX_POS", "Pmax", "Pmax >= 0", ""));
+    WalkRules(std::span<const T_RULE<T_PMM_TABLE>>(kTable), m_table, {}, out);
     return out;
-}
-
-int CPushOverPMMInteractionDlg::CheckData()
-{
-    const std::vector<T_FINDING> findings = Findings();
-    if (findings.empty()) return 1;
-    ShowMessage(findings.front().messageKey, findings.front().text);
-    return 0;
 }
 
 int CPushOverPMMInteractionDlg::OnOK()

@@ -1,11 +1,10 @@
 // Model of the dialog of user-defined P-M interaction curves.
 #pragma once
 
-#include "qm_base/mdialog.h"
 #include "qm_db/hingerecords.h"
-#include "qm_rps/hingefindings.h"
+#include "qm_rps/hingedialog.h"
 
-class CPushOverPMMInteractionDlg : public zql::frx::MDialog {
+class CPushOverPMMInteractionDlg : public CHingeDialog {
 public:
     /// Edits a copy; OnOK writes the whole table back to `record`, which is not owned.
     explicit CPushOverPMMInteractionDlg(T_PMM_TABLE& record) : m_table(record), m_record(record) {}
@@ -13,10 +12,8 @@ public:
     T_PMM_TABLE m_table; // as edited; ratios, Pmax a force
 
     /// Along each curve neither P nor M rises (equal values pass), then Pmax >= 0; a number that is
-    /// not finite fails its rule.
-    std::vector<T_FINDING> Findings() const;
-    /// Shows the first finding: IDS_PUSHOVER_Wrong_Data_in_P_values or IDS_PUSHOVER_PMAX_POS.
-    int CheckData() override;
+    /// not finite fails its rule. Keys: IDS_PUSHOVER_Wrong_Data_in_P_values, IDS_PUSHOVER_PMAX_POS.
+    std::vector<T_FINDING> Findings() const override;
     /// 1 and the record holds the table; 0 and the record is unchanged.
     int OnOK() override;
 

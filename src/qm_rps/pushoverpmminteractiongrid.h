@@ -1,32 +1,30 @@
 // Grid of one user-defined P-M interaction curve.
 #pragma once
 
-#include "qm_db/hingerecords.h"
-#include "qm_rps/hingenumbergrid.h"
+#include "qm_rps/pmpointgrid.h"
 
 inline constexpr std::array<const char*, 4> kPmmCurveNames{"Py-My(+)", "Py-My(-)", "Pz-Mz(+)",
                                                            "Pz-Mz(-)"};
 
 /// Eleven rows, columns P/Pmax and M/Mmax, with 5 digits. Two curves are stored, one per axis: (+)
 /// and (-) of an axis show and edit the same one. The table is not owned.
-class CPushoverPMMInteractionGrid : public CHingeNumberGrid {
+class CPushoverPMMInteractionGrid : public CPmPointGrid {
 public:
-    explicit CPushoverPMMInteractionGrid(T_PMM_TABLE& table) : m_table(table) {}
+    explicit CPushoverPMMInteractionGrid(T_PMM_TABLE& table)
+        : CPmPointGrid({"P/Pmax", "M/Mmax"}, "%.5g"), m_table(table)
+    {
+    }
 
     /// Which of kPmmCurveNames is shown. 1 done; 0 no such curve, unchanged.
     [[nodiscard]] int SelectCurve(std::size_t curve);
     std::size_t Curve() const { return m_curve; }
 
     std::size_t Rows() const override { return m_table.curves[0].size(); }
-    std::size_t Columns() const override { return 2; }
-    std::string RowHead(std::size_t row) const override;
-    std::string ColumnHead(std::size_t column) const override;
-
-protected:
-    double* CellOf(std::size_t row, std::size_t column) const override;
-    std::string Format(double value) const override;
+    std::string RowHead(std::size_t row) const override { return std::to_string(row + 1); }
 
 private:
+    T_PM_POINT& Point(std::size_t row) const override { return m_table.curves[m_curve / 2][row]; }
+
     T_PMM_TABLE& m_table;
     std::size_t m_curve = 0;
 };

@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_db/hingerecords.h"
-#include "qm_rps/sectionproperties.h"
+#include "qm_db/sectionproperties.h"
 
 #include <memory>
 #include <vector>

@@ -1,5 +1,7 @@
 #include "qm_rps/yieldstrengthcalcoptdlg.h"
 
+#include "qm_rps/yieldstrengthcalcopteffdescdlg.h"
+
 #include <algorithm>
 
 namespace {
@@ -42,4 +44,24 @@ int CYieldStrengthCalcOptDlg::OnSelectElemChk(bool on,
     std::sort(data.elements.begin(), data.elements.end());
     m_data = data;
     return 1;
+}
+
+void CYieldStrengthCalcOptDlg::SetElements(std::vector<int> elements, T_YIELD_CALC_LOOKUP lookup)
+{
+    m_all = std::move(elements);
+    m_lookup = std::move(lookup);
+}
+
+int CYieldStrengthCalcOptDlg::OnMatlDescBtn()
+{
+    CYieldStrengthCalcOptMatDescDlg dlg(Elements(), m_lookup);
+    dlg.SetView(View());
+    return dlg.DoModal();
+}
+
+int CYieldStrengthCalcOptDlg::OnEffeDescBtn()
+{
+    CYieldStrengthCalcOptEffDescDlg dlg(Elements(), m_lookup);
+    dlg.SetView(View());
+    return dlg.DoModal();
 }

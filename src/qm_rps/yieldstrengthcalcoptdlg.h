@@ -1,8 +1,7 @@
 // Model of the dialog of the options of the yield strength calculation.
 #pragma once
 
-#include "qm_base/mdialog.h"
-#include "qm_db/hingerecords.h"
+#include "qm_rps/yieldstrengthcalcoptmatdescdlg.h"
 
 #include <string_view>
 
@@ -39,11 +38,22 @@ public:
     /// Restricts the calculation to the selection, or takes the restriction off. 0 shows
     /// IDS_CMD2_SOD_SEL_ELEM_WRONG_ELEM for an element of another kind; the options stay.
     int OnSelectElemChk(bool on, const std::vector<T_SELECTED_ELEM>& selection);
-    /// Show how material strengths and section properties enter the calculation.
-    void OnMatlDescBtn() { ShowMessage("IDS_QM_YSCO_MATERIAL"); }
-    void OnEffeDescBtn() { ShowMessage("IDS_QM_YSCO_SECTION"); }
+    /// Elements that the calculation is for when it is not restricted, ascending, and where their
+    /// sections and materials come from.
+    void SetElements(std::vector<int> elements, T_YIELD_CALC_LOOKUP lookup);
+    /// The elements of the calculation: the selected ones, or all.
+    const std::vector<int>& Elements() const
+    {
+        return m_data.selectedOnly ? m_data.elements : m_all;
+    }
+    /// Show the material strengths, and the effective section properties, of these elements in the
+    /// view. 0 without a view.
+    int OnMatlDescBtn();
+    int OnEffeDescBtn();
 
 private:
     HINGE_ELEMENT m_element;
     T_YIELD_CALC_OPT m_data;
+    std::vector<int> m_all;
+    T_YIELD_CALC_LOOKUP m_lookup;
 };

@@ -168,8 +168,9 @@ T_VEC12 CBeamElement::FixedEndForces(std::span<const T_SPAN_LOAD> loads, double 
     return forces;
 }
 
-/// Displacements of the ends of the flexible length, local axes, released ones as the nodes'.
-T_VEC12 CBeamElement::EndsOf(const T_VEC12& displacement) const
+/// Displacements of the nodes taken to the ends of the flexible length, local axes, released or
+/// not.
+T_VEC12 CBeamElement::EndDisplacements(const T_VEC12& displacement) const
 {
     T_VEC12 local;
     for (std::size_t end = 0; end < 12; end += 6) {
@@ -183,9 +184,28 @@ T_VEC12 CBeamElement::EndsOf(const T_VEC12& displacement) const
     return local;
 }
 
+double CBeamElement::StrainEnergy(const T_VEC12& displacement) const
+{
+    const T_VEC12 u = EndDisplacements(displacement);
+    // Less the rigid-body motion of I's translation, the chord's rotation and I's twist.
+    const double chordY = (u[2] - u[8]) / m_shape.length, chordZ = (u[7] - u[1]) / m_shape.length;
+    T_VEC12 strain{};
+    strain[4] = u[4] - chordY;
+    strain[5] = u[5] - chordZ;
+    strain[6] = u[6] - u[0];
+    strain[9] = u[9] - u[3];
+    strain[10] = u[10] - chordY;
+    strain[11] = u[11] - chordZ;
+    double energy = 0.0;
+    for (std::size_t i = 0; i < 12; ++i)
+        for (std::size_t j = 0; j < 12; ++j)
+            energy += strain[i] * m_local[i][j] * strain[j];
+    return energy + m_tension * m_shape.length * (chordY * chordY + chordZ * chordZ);
+}
+
 T_VEC12 CBeamElement::EndForces(const T_VEC12& displacement, const T_VEC12& fixedEnd) const
 {
-    const T_VEC12 local = EndsOf(displacement);
+    const T_VEC12 local = EndDisplacements(displacement);
     T_VEC12 forces = fixedEnd;
     for (std::size_t i = 0; i < 12; ++i)
         for (std::size_t j = 0; j < 12; ++j)
@@ -226,7 +246,7 @@ T_VEC6 CBeamElement::InternalForces(const T_VEC12& endForces, std::span<const T_
 T_VEC12 CBeamElement::MovedEnds(const T_VEC12& displacement,
                                 std::span<const T_SPAN_LOAD> loads) const
 {
-    T_VEC12 ends = EndsOf(displacement), forces{};
+    T_VEC12 ends = EndDisplacements(displacement), forces{};
     for (const T_SPAN_LOAD& load : loads)
         AddFixedEndForces(m_shape, load, forces);
     for (const T_RELEASE& release : m_releases) {

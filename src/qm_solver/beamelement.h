@@ -38,6 +38,11 @@ public:
     /// Over the displacements of the nodes, global axes.
     void Stiffness(T_MATRIX12& global) const;
 
+    /// Twice the strain energy under displacements of the nodes, global axes. From the deformations
+    /// of the beam, so that a rigid-body motion leaves only the square of its rounding, and what a
+    /// tension does when the chord turns.
+    double StrainEnergy(const T_VEC12& displacement) const;
+
     /// Forces of the ends on the beam, local axes, when all node displacements are 0, the
     /// releases having given way. axial: the tension that a clamped beam would have from initial
     /// strains.
@@ -66,10 +71,9 @@ private:
         T_VEC12 gain; // column of the stiffness over its diagonal when `at` was released
         double pivot;
     };
+    T_VEC12 EndDisplacements(const T_VEC12& displacement) const;
     void MakeLocalStiffness(const T_MATERIAL& material, const T_SECTION& section);
-    void AddGeometric();
     void Release(std::size_t at, double diagonal);
-    T_VEC12 EndsOf(const T_VEC12& displacement) const;
     void MoveToNodes(T_MATRIX12& global, std::size_t first, const T_VEC3& offset) const;
 
     T_AXES m_axes{};

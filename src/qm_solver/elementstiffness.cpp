@@ -57,4 +57,31 @@ void ElementStiffness(const T_FRAME& frame, const T_ELEMENT& element, const T_AX
     }
 }
 
+double StrainEnergy(const T_FRAME& frame, const T_ELEMENT& element, const T_AXIAL& axial,
+                    const T_VEC12& u)
+{
+    double energy = 0.0, length = 0.0;
+    switch (element.kind) {
+    case ELEMENT_KIND::Beam:
+        return CBeamElement(frame, element, axial.tension).StrainEnergy(u);
+    case ELEMENT_KIND::Truss: {
+        const T_VEC3 e = TrussDirection(frame, element, length);
+        const T_VEC3 drift = Minus(Part(u, 6), Part(u, 0));
+        const double strain = Dot(e, drift);
+        const T_VEC3 across = Minus(drift, Scaled(e, strain));
+        return axial.modulus * TrussStiffness(frame, element, length) * strain * strain +
+               axial.tension / length * Dot(across, across);
+    }
+    case ELEMENT_KIND::Link:
+        for (std::size_t d = 0; d < 6; ++d)
+            energy += element.stiffness[d] * (u[6 + d] - u[d]) * (u[6 + d] - u[d]);
+        break;
+    case ELEMENT_KIND::Spring:
+        for (std::size_t d = 0; d < 6; ++d)
+            energy += element.stiffness[d] * u[d] * u[d];
+        break;
+    }
+    return energy;
+}
+
 } // namespace solver

@@ -33,4 +33,10 @@ double TrussStiffness(const T_FRAME& frame, const T_ELEMENT& element, double len
 void ElementStiffness(const T_FRAME& frame, const T_ELEMENT& element, const T_AXIAL& axial,
                       T_MATRIX12& stiffness);
 
+/// Twice the strain energy of an element under displacements of its nodes (global axes), from its
+/// deformations: a motion that does not strain it leaves only the square of its rounding, and the
+/// tension times what the turning chord would lengthen.
+double StrainEnergy(const T_FRAME& frame, const T_ELEMENT& element, const T_AXIAL& axial,
+                    const T_VEC12& displacement);
+
 } // namespace solver

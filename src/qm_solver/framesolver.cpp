@@ -7,6 +7,7 @@
 #include "qm_solver/frameextent.h"
 #include "qm_solver/mechanism.h"
 #include "qm_solver/modelcheck.h"
+#include "qm_solver/modesolver.h"
 #include "qm_solver/sparsefactor.h"
 #include "qm_solver/stabilitycheck.h"
 
@@ -50,7 +51,7 @@ std::optional<T_SOLVER_ERROR> CFrameSolver::T_STATE::Factorise()
     if (dofs.EquationCount() == 0) return {}; // everything is held
     if (!factor.Analyse(assembly.Matrix(), dofs.Blocks(), reason)) return Failed(reason);
     T_SOLVER_ERROR error;
-    if (!FactorStable(assembly.Matrix(), dofs, factor, error)) return error;
+    if (!FactorStable(frame, dofs, assembly.Matrix(), factor, error)) return error;
     return {};
 }
 
@@ -125,12 +126,16 @@ int CFrameSolver::Solve(std::span<const T_LOAD_CASE> cases, std::vector<T_RESULT
     return 1;
 }
 
-int CFrameSolver::Modes(std::size_t, std::vector<T_MODE>& out, T_SOLVER_ERROR& error,
-                        const ProgressFn&)
+int CFrameSolver::Modes(std::size_t count, std::vector<T_MODE>& out, T_SOLVER_ERROR& error,
+                        const ProgressFn& progress)
 {
     out.clear();
-    error = Failed("modes are not available");
-    return 0;
+    if (!m_state) {
+        error = Failed("no model is prepared");
+        return 0;
+    }
+    return SolveModes(m_state->frame, m_state->dofs, m_state->assembly.Matrix(), m_state->factor,
+                      count, out, error, progress);
 }
 
 } // namespace solver

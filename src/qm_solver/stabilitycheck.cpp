@@ -1,8 +1,8 @@
 #include "qm_solver/stabilitycheck.h"
 
 #include "qm_base/textformat.h"
-#include "qm_solver/directionname.h"
 #include "qm_solver/framedofs.h"
+#include "qm_solver/movement.h"
 
 #include <algorithm>
 #include <cmath>

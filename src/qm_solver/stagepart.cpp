@@ -93,7 +93,7 @@ std::optional<T_SOLVER_ERROR> CStagePart::Factorise(std::span<const T_AXIAL> axi
     std::string reason;
     T_SOLVER_ERROR error;
     if (stable) {
-        if (!FactorStable(Matrix(), *m_dofs, m_factor, error)) return error;
+        if (!FactorStable(m_frame, *m_dofs, Matrix(), m_factor, error, axial)) return error;
     } else if (!m_factor.Factor(Matrix(), reason)) {
         return Failed(reason);
     }

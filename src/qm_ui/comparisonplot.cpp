@@ -1,25 +1,12 @@
 #include "qm_ui/comparisonplot.h"
 
 #include "qm_base/textformat.h"
+#include "qm_ui/adrscurve.h"
 
 #include <algorithm>
 #include <vector>
 
 namespace {
-
-T_PLOT_SERIES Curve(const char* name, const T_ADRS_CURVE& c, PLOT_LINE line, double width,
-                    T_PLOT_COLOR color)
-{
-    T_PLOT_SERIES s;
-    s.name = name;
-    s.x = c.Sd;
-    s.y = c.Sa;
-    s.line = line;
-    s.width = width;
-    s.color = color;
-    s.marker = PLOT_MARKER::None;
-    return s;
-}
 
 /// Performance points as circles, target displacements as squares. Points that lie closer than
 /// 2 % of the picture share one label.
@@ -66,15 +53,13 @@ T_PLOT ComparisonPlot(const T_PUSH_COMPARISON& c)
                     "; circles: performance points, squares: target displacements";
     plot.x.title = "Spectral displacement Sd (" + unit + ")";
     plot.y.title = "Spectral acceleration Sa (g)";
-    plot.series.push_back(
-        Curve("Elastic demand", first.demand, PLOT_LINE::Solid, 1.6, {20, 64, 140}));
-    plot.series.push_back(Curve("Capacity", first.capacity, PLOT_LINE::Solid, 2.6, {0, 0, 0}));
+    AddAdrsCurve(plot, "Elastic demand", first.demand, PLOT_LINE::Solid, 1.6, {20, 64, 140});
+    AddAdrsCurve(plot, "Capacity", first.capacity, PLOT_LINE::Solid, 2.6, {0, 0, 0});
     for (const T_PUSH_EVALUATION& e : c.results) {
         if (e.eval.method != PUSH_METHOD::Ec8Opcm || !e.bilinear) continue;
         const T_BILINEAR& b = *e.bilinear;
-        plot.series.push_back(Curve("Bilinear capacity (EC8)",
-                                    {{0.0, b.dy, b.du}, {0.0, b.ay, b.au}}, PLOT_LINE::DashDot, 1.6,
-                                    {20, 110, 60}));
+        AddAdrsCurve(plot, "Bilinear capacity (EC8)", {{0.0, b.dy, b.du}, {0.0, b.ay, b.au}},
+                     PLOT_LINE::DashDot, 1.6, {20, 110, 60});
     }
     AddNotes(plot, c, unit);
     double x = 0.0, y = 0.0;

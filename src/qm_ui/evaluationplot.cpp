@@ -1,6 +1,7 @@
 #include "qm_ui/evaluationplot.h"
 
 #include "qm_base/textformat.h"
+#include "qm_ui/adrscurve.h"
 
 #include <algorithm>
 #include <array>
@@ -20,33 +21,18 @@ std::string ForceUnit(const T_PUSH_EVALUATION& e)
     return std::string(NameOf(e.units.force));
 }
 
-void AddCurve(T_PLOT& plot, const char* name, const T_ADRS_CURVE& c, PLOT_LINE line, double width,
-              T_PLOT_COLOR color, PLOT_MARKER marker = PLOT_MARKER::None)
-{
-    if (c.Sd.empty()) return;
-    T_PLOT_SERIES s;
-    s.name = name;
-    s.x = c.Sd;
-    s.y = c.Sa;
-    s.line = line;
-    s.width = width;
-    s.color = color;
-    s.marker = marker;
-    plot.series.push_back(std::move(s));
-}
-
 /// The elastic demand; for NTC one curve for each enabled limit state.
 void AddDemands(T_PLOT& plot, const T_PUSH_EVALUATION& e)
 {
     if (e.stateDemands.empty()) {
-        AddCurve(plot, "Elastic demand", e.demand, PLOT_LINE::Solid, 1.6, kBlue);
+        AddAdrsCurve(plot, "Elastic demand", e.demand, PLOT_LINE::Solid, 1.6, kBlue);
         return;
     }
     constexpr std::array<PLOT_LINE, 4> kLines{PLOT_LINE::Dot, PLOT_LINE::DashDot, PLOT_LINE::Dash,
                                               PLOT_LINE::Solid};
     for (std::size_t i = 0; i < e.stateDemands.size(); ++i) {
         const std::string name = std::string("Elastic demand ") + kLimitStateNames[i];
-        AddCurve(plot, name.c_str(), e.stateDemands[i], kLines[i], 1.6, kBlue);
+        AddAdrsCurve(plot, name.c_str(), e.stateDemands[i], kLines[i], 1.6, kBlue);
     }
 }
 
@@ -77,7 +63,7 @@ void AddTrials(T_PLOT& plot, const T_PUSH_EVALUATION& e)
         points.Sd.push_back(t.dpi);
         points.Sa.push_back(t.api);
     }
-    AddCurve(plot, "Trial points", points, PLOT_LINE::None, 1.0, kOchre, PLOT_MARKER::Square);
+    AddAdrsCurve(plot, "Trial points", points, PLOT_LINE::None, 1.0, kOchre, PLOT_MARKER::Square);
     constexpr std::size_t kNumbered = 6;
     if (e.trace.size() > kNumbered) return;
     for (const T_PERFPT_TRIAL& t : e.trace)
@@ -119,8 +105,8 @@ void AddTargets(T_PLOT& plot, const T_PUSH_EVALUATION& e)
 {
     if (e.bilinear) {
         const T_BILINEAR& b = *e.bilinear;
-        AddCurve(plot, "Bilinear capacity", {{0.0, b.dy, b.du}, {0.0, b.ay, b.au}},
-                 PLOT_LINE::DashDot, 1.6, kGreen);
+        AddAdrsCurve(plot, "Bilinear capacity", {{0.0, b.dy, b.du}, {0.0, b.ay, b.au}},
+                     PLOT_LINE::DashDot, 1.6, kGreen);
     }
     for (const T_GUIDE_LINE& line : e.guideLines) {
         T_PLOT_GUIDE g;
@@ -191,11 +177,12 @@ T_PLOT EvaluationPlot(const T_PUSH_EVALUATION& e)
     plot.x.title = "Spectral displacement Sd (" + LengthUnit(e) + ")";
     plot.y.title = "Spectral acceleration Sa (g)";
     AddDemands(plot, e);
-    AddCurve(plot, "Working demand of the last trial", e.working, PLOT_LINE::DashDot, 1.4, kGray);
-    AddCurve(plot, "Reduced demand", e.reduced, PLOT_LINE::Dash, 1.8, kRed);
-    AddCurve(plot, "Capacity", e.capacity, PLOT_LINE::Solid, 2.6, kBlack);
-    AddCurve(plot, "Locus of demand points", e.locus, PLOT_LINE::Dot, 1.6, kGreen,
-             PLOT_MARKER::Triangle);
+    AddAdrsCurve(plot, "Working demand of the last trial", e.working, PLOT_LINE::DashDot, 1.4,
+                 kGray);
+    AddAdrsCurve(plot, "Reduced demand", e.reduced, PLOT_LINE::Dash, 1.8, kRed);
+    AddAdrsCurve(plot, "Capacity", e.capacity, PLOT_LINE::Solid, 2.6, kBlack);
+    AddAdrsCurve(plot, "Locus of demand points", e.locus, PLOT_LINE::Dot, 1.6, kGreen,
+                 PLOT_MARKER::Triangle);
     AddTargets(plot, e);
     AddTrials(plot, e);
     AddPoint(plot, e);

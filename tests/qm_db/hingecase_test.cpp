@@ -161,7 +161,7 @@ TEST(HingeCase, BadInputNamesThePlace)
         {"\"sections\"", "0.3, 0.5]", "0.3, 0.5, 1]", "sections[0].size: 5 values, expected up to 4"},
         {"\"elements\"", "\"id\": 7", "\"id\": 4", "elements[1].id: element 4 appears twice"},
         {"\"elements\"", "[2, 3]", "[2, 5]", "elements[1].nodes[1]: there is no such node"},
-        {"\"elements\"", "\"section\": 2", "\"section\": 12", "elements[1].section: there is no such section"},
+        {"\"elements\"", "\"section\": \"R\"", "\"section\": \"Q\"", "elements[1].section: there is no such section"},
         {"hinge_types", "\"section\": 2", "\"section\": 9", "hinge_types[0].section: there is no such section"},
         {"hinge_types", "\"degrading slip\"", "\"slip\"", "hinge_types[0].components.My.I.unload_type: unknown unloading type \"slip\"; allowed: origin, nonlinear elastic, bilinear, stiffness degrading, degrading slip"},
         {"hinge_types", "\"type\": \"FEMA\",", "", "hinge_types[0].components.My: \"type\" is missing"},
@@ -233,7 +233,7 @@ TEST(HingeCase, RefusesToStoreWhatCouldNotBeRead)
 }
 
 // The file was written by the program when it knew version 1 only, out of all_members.json.
-TEST(HingeCase, AFileOfVersion1OpensAndIsSavedAsVersion2)
+TEST(HingeCase, AFileOfVersion1OpensAndIsSavedAsTheCurrentVersion)
 {
     const CTempFolder folder;
     const std::string path = folder.File("model.qmdb");
@@ -252,8 +252,33 @@ TEST(HingeCase, AFileOfVersion1OpensAndIsSavedAsVersion2)
     content.model.pushovers.at(1).control = T_POLC_CONTROL{};
     content.model.styp.gsd = true;
     ASSERT_EQ(1, store.Save(path, content, error)) << error.text;
-    EXPECT_EQ(2, BytesOf(path)[63]);
+    EXPECT_EQ(3, BytesOf(path)[63]);
     ASSERT_EQ(1, CModelStore::CheckWhole(path, error)) << error.text;
+    ASSERT_EQ(1, CModelStore().Open(path, OPEN_MODE::ReadOnly, again, error)) << error.text;
+    EXPECT_TRUE(SameContent(content, again));
+}
+
+// Files written by the program when it knew version 2: the case file and its model file.
+TEST(HingeCase, FilesWithOlderKeysAndOfVersion2HoldTheSameModel)
+{
+    const T_MODEL_CONTENT now = ParseGood(RichText());
+    T_MODEL_CONTENT text, content, again;
+    T_FILE_ERROR error;
+    ASSERT_EQ(1, CCaseFile::Read(kData + "/cases/hinge_old_keys.json", text, error)) << error.text;
+    EXPECT_TRUE(SameContent(now, text));
+
+    const CTempFolder folder;
+    const std::string path = folder.File("model.qmdb");
+    WriteBytes(path, BytesOf(kData + "/model-v2.qmdb"));
+    ASSERT_EQ(2, BytesOf(path)[63]);
+    CModelStore store;
+    ASSERT_EQ(1, store.Open(path, OPEN_MODE::Edit, content, error)) << error.text;
+    EXPECT_TRUE(SameContent(now, content));
+    content.model.loadCases[1] = {"G", {0, 0, -1}, {}, {}, {}, {}, {}};
+    content.model.styp.plane = MODEL_PLANE::XZ;
+    content.model.elements.at(4).release.I[4] = true;
+    ASSERT_EQ(1, store.Save(path, content, error)) << error.text;
+    EXPECT_EQ(3, BytesOf(path)[63]);
     ASSERT_EQ(1, CModelStore().Open(path, OPEN_MODE::ReadOnly, again, error)) << error.text;
     EXPECT_TRUE(SameContent(content, again));
 }

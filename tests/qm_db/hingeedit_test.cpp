@@ -181,8 +181,12 @@ TEST(HingeEdit, EveryRecordIsPutErasedAndUndone)
     EXPECT_EQ(1, doc.Attr().GetSectMatlByElem(1, sect, matl));
 
     ASSERT_EQ(1, doc.Edit().Begin("erase"));
+    EXPECT_EQ(0, doc.Edit().Erase<T_MATL_D>(1)); // the element uses it
+    EXPECT_EQ(0, doc.Edit().Erase<T_ELEM_D>(1)); // the hinge uses it
+    ASSERT_EQ(1, doc.Edit().Erase<T_PHGE_D>(1));
+    ASSERT_EQ(1, doc.Edit().Erase<T_ELEM_D>(1));
     ASSERT_EQ(1, doc.Edit().Erase<T_MATL_D>(1));
-    ASSERT_EQ(1, doc.Edit().Erase<T_PHGT_D>(1)); // the hinge uses type 2
+    ASSERT_EQ(1, doc.Edit().Erase<T_PHGT_D>(1));
     ASSERT_EQ(1, doc.Edit().Commit());
     EXPECT_TRUE(doc.Data().Model().hingeTypes.empty());
     EXPECT_EQ(0, doc.Attr().GetSectMatlByElem(1, sect, matl));

@@ -57,10 +57,10 @@ constexpr auto kPoint = BEAM_LOAD::Point;
 constexpr auto kMoment = BEAM_LOAD::Moment;
 
 // Internal forces by statics; end moments of clamped and propped beams from the usual tables
-// (w L^2 / 12, w L^2 / 8, P a b^2 / L^2, triangle w L^2 / 30 and 20, end moments M0 b (2a - b) / L^2 and
-// M0 a (2b - a) / L^2 on the beam, in the sense of M0);
-// with shear deformation the prop carries w L (3 + phi) / (8 + 2 phi), which follows from the
-// cantilever's deflections w L^4 / 8EI + w L^2 / 2GAs and P L^3 / 3EI + P L / GAs. L = 4.
+// (w L^2 / 12, w L^2 / 8, P a b^2 / L^2, triangle w L^2 / 30 and 20, end moments M0 b (2a - b) /
+// L^2 and M0 a (2b - a) / L^2 on the beam, in the sense of M0); with shear deformation the prop
+// carries w L (3 + phi) / (8 + 2 phi), which follows from the cantilever's deflections w L^4 / 8EI
+// + w L^2 / 2GAs and P L^3 / 3EI + P L / GAs. L = 4.
 // clang-format off
 const T_ROW kRows[] = {
     {"cantilever, load up z: moment y", false, {}, {}, 0, 0, {0, kLine, true, 2, {3, 3}, {0, 1}}, 4,

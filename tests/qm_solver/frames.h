@@ -4,6 +4,7 @@
 #include "qm_solver/framemodel.h"
 
 #include <initializer_list>
+#include <utility>
 
 namespace sample {
 
@@ -48,6 +49,25 @@ inline void Join(T_FRAME& frame, ELEMENT_KIND kind, std::size_t i, std::size_t j
     e.j = j;
     e.stiffness = stiffness;
     frame.elements.push_back(e);
+}
+
+/// A tower of beams with nodal and distributed mass, irregular; four nodes a storey, clamped feet.
+/// Elements 8 s + 2 c are columns, 8 s + 2 c + 1 floor beams.
+inline T_FRAME IrregularTower(std::size_t storeys)
+{
+    T_FRAME frame = Empty();
+    frame.materials[0].density = 7.85;
+    for (std::size_t s = 0; s <= storeys; ++s)
+        for (auto [x, y] : {std::pair{0.0, 0.0}, {5.0, 0.3}, {5.5, 4.0}, {-0.2, 4.4}})
+            AddNode(frame, {x, y, 3.0 * double(s) + 0.1 * x});
+    for (std::size_t n = 0; n + 4 < frame.nodes.size(); ++n) {
+        Join(frame, ELEMENT_KIND::Beam, n, n + 4);
+        Join(frame, ELEMENT_KIND::Beam, n + 4, 4 * (n / 4 + 1) + (n + 1) % 4);
+        frame.nodes[n + 4].mass = {1.0, 1.5, n % 3 ? 0.5 : 0.0};
+    }
+    for (std::size_t n = 0; n < 4; ++n)
+        Fix(frame, n, {0, 1, 2, 3, 4, 5});
+    return frame;
 }
 
 } // namespace sample

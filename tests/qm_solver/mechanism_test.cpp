@@ -30,10 +30,11 @@ T_SYMMETRIC_MATRIX Chain(const std::vector<double>& spring)
     return k;
 }
 
-/// The mechanism that a chain shows, if any; all pivots as they are when `blind`.
-std::optional<std::vector<double>> MechanismOf(const T_SYMMETRIC_MATRIX& k, std::size_t& alarms,
-                                               PIVOTS pivots = PIVOTS::Watch)
+/// The mechanism that a chain shows, if any.
+std::optional<std::vector<double>> MechanismOf(const std::vector<double>& spring,
+                                               std::size_t& alarms, PIVOTS pivots = PIVOTS::Watch)
 {
+    const T_SYMMETRIC_MATRIX k = Chain(spring);
     CSparseFactor factor;
     std::string reason;
     std::vector<int> block(k.Size());
@@ -41,20 +42,29 @@ std::optional<std::vector<double>> MechanismOf(const T_SYMMETRIC_MATRIX& k, std:
     EXPECT_EQ(1, factor.Analyse(k, block, reason)) << reason;
     EXPECT_EQ(1, factor.Factor(k, reason, pivots)) << reason;
     alarms = factor.Info().nullPivots.size();
+    const auto strainless = [&](std::span<const double> v) {
+        double energy = 0.0, apart = 0.0;
+        for (std::size_t i = 0; i < v.size(); ++i) {
+            const double before = i == 0 ? 0.0 : v[i - 1];
+            energy += spring[i] * (v[i] - before) * (v[i] - before);
+            apart += spring[i] * (v[i] * v[i] + before * before);
+        }
+        return energy <= 1e-20 * apart;
+    };
     std::optional<std::vector<double>> shape;
-    EXPECT_EQ(1, FindMechanism(k, factor, shape, reason)) << reason;
+    EXPECT_EQ(1, FindMechanism(k, factor, strainless, shape, reason)) << reason;
     return shape;
 }
 
 TEST(Mechanism, HasNothingToSayOfStiffnessContrasts)
 {
-    for (double contrast : {1.0, 1e4, 1e8, 1e10, 1e12, 1e14})
+    for (double contrast : {1.0, 1e4, 1e8, 1e10, 1e12, 1e14, 1e15})
         for (std::size_t soft : {0u, 20u, 58u}) {
             SCOPED_TRACE(testing::Message() << contrast << " over spring " << soft);
             std::vector<double> spring(60, contrast);
             spring[soft] = 1.0;
             std::size_t alarms = 0;
-            EXPECT_FALSE(MechanismOf(Chain(spring), alarms));
+            EXPECT_FALSE(MechanismOf(spring, alarms));
             if (contrast <= 1e10) {
                 EXPECT_EQ(0u, alarms);
             }
@@ -68,7 +78,7 @@ TEST(Mechanism, IsNoPivotThatVanishesForContrastAlone)
         spring[i] = 3.0e14 * (1.0 + 0.37 * static_cast<double>(i * 7 % 5));
     spring[1] = 1.0;
     std::size_t alarms = 0;
-    EXPECT_FALSE(MechanismOf(Chain(spring), alarms));
+    EXPECT_FALSE(MechanismOf(spring, alarms));
     EXPECT_EQ(1u, alarms) << "no false alarm any more: this test needs another example";
 }
 
@@ -87,7 +97,7 @@ TEST(Mechanism, IsTheLooseEndOfAChainWhetherAPivotShowsItOrNot)
         for (std::size_t i = 0; i < spring.size(); ++i)
             spring[i] = i == c.gap ? 0.0 : 1.0e7 / 3.0 * (1.1 + std::sin(double(i)));
         std::size_t alarms = 0;
-        const auto shape = MechanismOf(Chain(spring), alarms, c.pivots);
+        const auto shape = MechanismOf(spring, alarms, c.pivots);
         ASSERT_TRUE(shape);
         ASSERT_NE(0.0, (*shape)[59]);
         for (std::size_t i = 0; i < spring.size(); ++i)

@@ -268,6 +268,132 @@ TEST(StagedSecondOrder, CablesWithSagBalanceTheirLoad)
     }
 }
 
+// ---- a small cable-stayed bridge ----------------------------------------------------------------
+
+constexpr std::size_t kTop = 5;
+
+/// Deck nodes 0 to 3 along X from the tower's foot 4 outwards on one side, backstay to 6; stays
+/// (elements 5, 6, 7) and backstay 8 come with the deck's pieces.
+T_STAGED_MODEL Stayed()
+{
+    T_STAGED_MODEL model;
+    T_FRAME& frame = model.frame;
+    frame = Empty();
+    frame.materials[0].density = 7.85;
+    for (const T_VEC3 at : {T_VEC3{0, 0, 10},
+                            {12, 0, 10},
+                            {24, 0, 10},
+                            {36, 0, 10},
+                            {0, 0, 0},
+                            {0, 0, 30},
+                            {-25, 0, 4}})
+        AddNode(frame, at);
+    for (T_NODE& node : frame.nodes)
+        node.fixed = {false, true, false, true, false, true};
+    FixAll(frame, 4);
+    Fix(frame, 6, {0, 2});
+    Join(frame, kBeam, 4, 0);
+    Join(frame, kBeam, 0, kTop);
+    for (const std::size_t n : {0, 1, 2})
+        Join(frame, kBeam, n, n + 1);
+    for (const std::size_t n : {1, 2, 3})
+        Join(frame, kTruss, n, kTop);
+    Join(frame, kTruss, 6, kTop);
+    model.options = {BIRTH::OnDeformed, true, true};
+    model.groups.assign(3, LOAD_GROUP::Dead);
+    model.stages.resize(3);
+    model.stages[0].activateElements = {0, 1, 2, 5, 8};
+    model.stages[1].activateElements = {3, 6};
+    model.stages[2].activateElements = {4, 7};
+    for (std::size_t n = 0; n < frame.nodes.size(); ++n)
+        model.stages[0].activateSupports.push_back({n, {}});
+    for (std::size_t s = 0; s < 3; ++s)
+        model.stages[s].activateLoads = {{s, 1}};
+    return model;
+}
+
+/// Each with the weight of the new piece, its stay's tension and some of the backstay's.
+std::vector<T_LOAD_CASE> StayedCases()
+{
+    std::vector<T_LOAD_CASE> cases(3);
+    for (std::size_t s = 0; s < 3; ++s) {
+        cases[s].nodal.push_back({s + 1, {0, 0, -30.0, 0, 2.0, 0}});
+        cases[s].pretension = {{5 + s, 90.0 - 10.0 * double(s)}, {8, 50.0}};
+    }
+    return cases;
+}
+
+T_VEC3 Minus(const T_VEC3& a, const T_VEC3& b)
+{
+    return {a[0] - b[0], a[1] - b[1], a[2] - b[2]};
+}
+
+TEST(StagedSecondOrder, EveryStageOfAStayedBridgeIsInBalance)
+{
+    const T_STAGED_MODEL model = Stayed();
+    const std::vector<T_LOAD_CASE> cases = StayedCases();
+    CStagedSolver staged;
+    Build(staged, model, cases);
+    const T_FRAME& frame = model.frame;
+    T_RESULT r, before;
+    before.displacement.resize(frame.nodes.size());
+    std::vector<double> tension(frame.elements.size(), 0.0);
+    std::vector<T_RESULT> births(frame.elements.size());
+    for (std::size_t s = 0; s < 3; ++s) {
+        ASSERT_TRUE(staged.ReadSum(s, kLastStep, STAGE_SUM::All, r));
+        std::vector<T_VEC6> rest = r.reaction;
+        for (const T_PRETENSION& p : cases[s].pretension)
+            tension[p.element] += p.force;
+        for (std::size_t c = 0; c <= s; ++c) {
+            for (std::size_t d = 0; d < 6; ++d)
+                rest[cases[c].nodal[0].node][d] += cases[c].nodal[0].load[d];
+            for (const std::size_t e : model.stages[c].activateElements) {
+                if (c == s) births[e] = before;
+                const T_ELEMENT& el = frame.elements[e];
+                const T_VEC3 along = Minus(frame.nodes[el.j].xyz, frame.nodes[el.i].xyz);
+                const double length = std::hypot(along[0], along[2]), x = along[0] / length,
+                             z = along[2] / length;
+                for (const bool atJ : {false, true}) {
+                    // On the node: from the beam's cut; axial, shear z and moment y in the plane.
+                    const std::size_t node = atJ ? el.j : el.i;
+                    const T_VEC6& f = r.force[e][atJ ? 4 : 0];
+                    double across = f[2], moment = f[4];
+                    const double sign = atJ ? -1.0 : 1.0;
+                    double acrossX = -z, acrossZ = x; // local z; of the tower it is global X
+                    if (el.kind == kBeam && x == 0.0) {
+                        acrossX = 1.0;
+                        acrossZ = 0.0;
+                        moment = -moment; // local y is -Y
+                    }
+                    if (el.kind == kTruss) {
+                        const double drift =
+                            -z * (r.displacement[el.j][0] - r.displacement[el.i][0]) +
+                            x * (r.displacement[el.j][2] - r.displacement[el.i][2]);
+                        across = f[0] / length * drift;
+                    }
+                    rest[node][0] += sign * (f[0] * x + across * acrossX);
+                    rest[node][2] += sign * (f[0] * z + across * acrossZ);
+                    rest[node][4] += sign * moment;
+                }
+                if (el.kind != kTruss) continue;
+                const auto stretch = [&](const T_RESULT& at) {
+                    const T_VEC6 &i = at.displacement[el.i], &j = at.displacement[el.j];
+                    return x * (j[0] - i[0]) + z * (j[2] - i[2]);
+                };
+                const double n = r.force[e][0][0], w = 7.85 * kA * frame.gravity;
+                const double modulus = 1 / (1 + std::pow(w * along[0], 2) * kEA / (12 * n * n * n));
+                EXPECT_NEAR(tension[e] + modulus * kEA / length * (stretch(r) - stretch(births[e])),
+                            n, 1e-8)
+                    << s << " element " << e;
+                EXPECT_LT(modulus, 0.999);
+            }
+        }
+        EXPECT_LT(LargestOf(rest), 1e-8) << s;
+        EXPECT_GT(std::fabs(r.displacement[s + 1][2]), 1e-3); // far above what rounding could hide
+        before = r;
+    }
+}
+
 TEST(StagedSecondOrder, WithoutAxialForcesItIsTheFirstOrder)
 {
     T_STAGED_MODEL model = Column(3);

@@ -98,12 +98,14 @@ TEST(HingeType, ConvertsInteractionCodesBothWays)
 
 TEST(HingeType, ReportsEveryFindingAndRefusesAsAWhole)
 {
-    const T_SECT_D noBars;
     T_MATL_D concrete;
     concrete.type = MATL_CLASS::Concrete;
+    T_SECT_D noBars;
+    noBars.shape = SECT_SHAPE::Rectangle;
+    noBars.size = {4, 3};
     T_HINGE_CONTEXT x;
-    x.section = [&](int key) { return key == 1 ? &noBars : nullptr; };
-    x.material = [&](int key) { return key == 1 ? &concrete : nullptr; };
+    x.sources = std::make_shared<CHingeSources>(T_TABLE<T_SECT_D>{{1, noBars}},
+                                                T_TABLE<T_MATL_D>{{1, concrete}});
     T_PHGT_D stored = ValidType();
     CPO_HingeTypeDlg dlg(x);
     dlg.Data2Dlg(stored);

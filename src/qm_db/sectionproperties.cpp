@@ -1,4 +1,4 @@
-#include "qm_rps/sectionproperties.h"
+#include "qm_db/sectionproperties.h"
 
 #include <cmath>
 #include <numbers>

@@ -1,7 +1,7 @@
 // Properties of rectangle, circle, pipe, box and I from their dimensions (sharp corners).
 #pragma once
 
-#include "qm_db/hingerecords.h"
+#include "qm_db/structrecords.h"
 
 #include <vector>
 

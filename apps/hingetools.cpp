@@ -1,0 +1,54 @@
+#include "hingetools.h"
+
+#include <algorithm>
+
+EXIT_CODE Complain(EXIT_CODE code, const std::string& text)
+{
+    std::fprintf(stderr, "qm-rps: %s\n", text.c_str());
+    return code;
+}
+
+EXIT_CODE NoSuchType(const std::string& file, const std::string& type)
+{
+    return Complain(EXIT_CODE::Usage, file + ": no hinge type named \"" + type + "\"");
+}
+
+std::optional<HINGE_COMPONENT> ComponentOf(const std::string& name)
+{
+    const auto it = std::ranges::find(kComponentNames, name);
+    if (it == kComponentNames.end()) return std::nullopt;
+    return static_cast<HINGE_COMPONENT>(it - kComponentNames.begin());
+}
+
+const char* EndName(HINGE_END end)
+{
+    return end == HINGE_END::I ? "I-end" : end == HINGE_END::J ? "J-end" : "both ends";
+}
+
+EXIT_CODE OpenType(CDBDoc& doc, const T_HINGE_OPTIONS& o, int& key, T_PHGT_D& type)
+{
+    if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
+    if (doc.Attr().FindPhgt(o.type, key) && doc.Attr().GetPhgt(key, type)) return EXIT_CODE::Done;
+    return NoSuchType(doc.Path(), o.type);
+}
+
+EXIT_CODE WriteDoc(CDBDoc& doc, const std::string& path)
+{
+    T_FILE_ERROR error;
+    const int written =
+        path.ends_with(".qmdb") ? doc.SaveModelAs(path, error) : doc.ExportCase(path, error);
+    return written ? EXIT_CODE::Done : ReportFileError(error);
+}
+
+T_SKEL_CURVE* PageOf(T_HINGE_COMPONENT& component, const std::string& end, HINGE_END& page)
+{
+    T_SKEL_CURVE* found = nullptr;
+    ForEachPage(component, [&](HINGE_END e, T_SKEL_CURVE& curve) {
+        const bool wanted =
+            end.empty() || (end == "I" && e != HINGE_END::J) || (end == "J" && e != HINGE_END::I);
+        if (found || !wanted) return;
+        found = &curve;
+        page = e;
+    });
+    return found;
+}

@@ -1,0 +1,117 @@
+#include "qm_db/analysisrun.h"
+
+#include "qm_base/msgfunction.h"
+#include "qm_db/analysismodel.h"
+#include "qm_db/fingerprint.h"
+
+#include <algorithm>
+#include <span>
+
+namespace {
+
+constexpr std::size_t kBatch = 64; // load cases at a time: what the engine solves in one block
+
+/// The progress of a part of the run as progress of the whole run.
+solver::ProgressFn Part(const T_ANALYSIS_OPTIONS& options, std::size_t before, std::size_t total)
+{
+    if (!options.progress) return {};
+    return [&options, before, total](std::size_t done, std::size_t) {
+        return options.progress(std::min(before + done, total), total);
+    };
+}
+
+/// The engine and what it works on.
+struct T_RUN {
+    const T_MODEL& model;
+    const T_ANALYSIS_OPTIONS& options;
+    CAnalysisModel frame;
+    solver::CFrameSolver engine;
+    std::vector<int> cases;
+    std::size_t total = 0; // parts of the run: cases and modes
+
+    int Fail(const solver::T_SOLVER_ERROR& fault, std::span<const int> keys,
+             T_ANALYSIS_ERROR& error) const
+    {
+        error = frame.ErrorOf(fault, keys);
+        return 0;
+    }
+};
+
+int SolveBatch(T_RUN& run, std::size_t first, std::uint64_t structure,
+               std::vector<std::shared_ptr<IStaticResult>>& out, T_ANALYSIS_ERROR& error)
+{
+    const std::span<const int> keys =
+        std::span<const int>(run.cases).subspan(first, std::min(kBatch, run.cases.size() - first));
+    std::vector<solver::T_LOAD_CASE> loads(keys.size());
+    for (std::size_t i = 0; i < keys.size(); ++i) {
+        if (!run.frame.BuildCase(keys[i], loads[i], error)) return 0;
+    }
+    std::vector<solver::T_RESULT> results;
+    solver::T_SOLVER_ERROR fault;
+    if (!run.engine.Solve(loads, results, fault, Part(run.options, first, run.total)))
+        return run.Fail(fault, keys, error);
+    for (std::size_t i = 0; i < keys.size(); ++i) {
+        const std::uint64_t print = FingerprintOfCase(structure, run.model.loadCases.at(keys[i]));
+        out.push_back(MakeStaticResult(run.frame.ResultOf(results[i], print)));
+        results[i] = {};
+    }
+    return 1;
+}
+
+int FindModes(T_RUN& run, std::vector<T_EIGV_D>& out, T_ANALYSIS_ERROR& error)
+{
+    std::vector<solver::T_MODE> modes;
+    solver::T_SOLVER_ERROR fault;
+    if (!run.engine.Modes(static_cast<std::size_t>(run.options.modes), modes, fault,
+                          Part(run.options, run.cases.size(), run.total)))
+        return run.Fail(fault, {}, error);
+    for (const solver::T_MODE& mode : modes)
+        out.push_back(run.frame.ModeOf(mode));
+    return 1;
+}
+
+} // namespace
+
+int CAnalysisRun::KeepModes(std::vector<T_EIGV_D> modes)
+{
+    const bool own = !m_edit.IsOpen();
+    if (own && !m_edit.Begin(zql::lib::MMSGFunction::GetValue("IDS_QM_DB_STEP_MODES"))) return 0;
+    int done = 1;
+    std::vector<int> old;
+    for (const auto& entry : m_data.Model().modes)
+        old.push_back(entry.first);
+    for (const int key : old)
+        done = done && m_edit.Erase<T_EIGV_D>(key);
+    for (std::size_t i = 0; i < modes.size(); ++i)
+        done = done && m_edit.Put(static_cast<int>(i) + 1, std::move(modes[i]));
+    return own ? done && m_edit.Commit() : done;
+}
+
+int CAnalysisRun::Run(const T_ANALYSIS_OPTIONS& options, T_ANALYSIS_ERROR& error)
+{
+    const T_MODEL& model = m_data.Model();
+    T_RUN run{model, options, CAnalysisModel(model), {}, options.cases, 0};
+    if (options.allCases) {
+        run.cases.clear();
+        for (const auto& entry : model.loadCases)
+            run.cases.push_back(entry.first);
+    }
+    run.total = run.cases.size() + static_cast<std::size_t>(std::max(options.modes, 0));
+    error = {};
+
+    solver::T_SOLVER_ERROR fault;
+    if (!run.frame.BuildFrame(error)) return 0;
+    if (!run.engine.Prepare(run.frame.Frame(), fault)) return run.Fail(fault, {}, error);
+
+    const std::uint64_t structure = FingerprintOfStructure(model);
+    std::vector<std::shared_ptr<IStaticResult>> results;
+    for (std::size_t first = 0; first < run.cases.size(); first += kBatch) {
+        if (!SolveBatch(run, first, structure, results, error)) return 0;
+    }
+    std::vector<T_EIGV_D> modes;
+    if (options.modes > 0 && !FindModes(run, modes, error)) return 0;
+
+    for (std::size_t i = 0; i < results.size(); ++i)
+        m_data.SetStaticResult(run.cases[i], std::move(results[i]));
+    return options.modes > 0 ? KeepModes(std::move(modes)) : 1;
+}

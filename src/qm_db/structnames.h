@@ -1,0 +1,23 @@
+// Names of the case file for the structure, its loads and unknown load factors, in the order of
+// their enumerations and numbers.
+#pragma once
+
+#include <array>
+
+inline constexpr std::array<const char*, 4> kElemKindNames{"beam", "truss", "link", "spring"};
+inline constexpr std::array<const char*, 6> kReleaseNames{"Dx", "Dy", "Dz", "Rx", "Ry", "Rz"};
+inline constexpr std::array<const char*, 3> kAxisNames{"X", "Y", "Z"};
+inline constexpr std::array<const char*, 3> kPlaneNames{"XY", "XZ", "YZ"};
+
+inline constexpr std::array<const char*, 2> kLoadAxesNames{"local", "global"};
+inline constexpr std::array<const char*, 3> kLoadDirectionNames{"x", "y", "z"};
+inline constexpr std::array<const char*, 3> kBeamLoadNames{"distributed", "point", "moment"};
+
+inline constexpr std::array<const char*, 4> kUlfcTypeNames{"reaction", "displacement", "truss",
+                                                           "beam"};
+inline constexpr std::array<const char*, 6> kReactionNames{"FX", "FY", "FZ", "MX", "MY", "MZ"};
+inline constexpr std::array<const char*, 6> kBeamForceNames{"axial",   "shear y",  "shear z",
+                                                            "torsion", "moment y", "moment z"};
+inline constexpr std::array<const char*, 5> kPositionNames{"I", "1/4", "2/4", "3/4", "J"};
+inline constexpr std::array<const char*, 3> kObjectiveNames{"linear", "square", "min-max"};
+inline constexpr std::array<const char*, 3> kSignNames{"negative", "free", "positive"};

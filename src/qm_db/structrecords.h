@@ -1,0 +1,103 @@
+// Records of the structure: materials, sections, elements, nodes that move together. Plain data; in
+// the store every quantity is in SI.
+#pragma once
+
+#include <array>
+#include <optional>
+#include <string>
+#include <vector>
+
+/// One value for either end of an element.
+template <class T>
+struct T_ENDS {
+    T I{}, J{};
+    bool operator==(const T_ENDS&) const = default;
+};
+
+// ---- section and material ---------------------------------------------------------------------
+
+enum class MATL_CLASS { Concrete, Steel, Composite, Masonry };
+
+struct T_MATL_D {
+    std::string name;
+    MATL_CLASS type = MATL_CLASS::Steel;
+    double E = 0.0;            // elastic modulus
+    double nu = 0.0;           // Poisson's ratio
+    double Fy = 0.0;           // yield strength of steel
+    double fck = 0.0;          // compressive strength of concrete or masonry
+    double fyk = 0.0;          // yield strength of the bars of concrete
+    double Es = 0.0;           // elastic modulus of the bars
+    std::optional<double> G{}; // shear modulus; absent: E / (2 (1 + nu))
+    double density = 0.0;      // mass per volume
+    double alpha = 0.0;        // thermal expansion, 1 / degree
+    bool operator==(const T_MATL_D&) const = default;
+};
+
+enum class SECT_SHAPE { Value, Rectangle, Circle, Pipe, Box, IShape };
+
+/// A reinforcing bar in section coordinates, from the centroid.
+struct T_REBAR {
+    double y = 0.0, z = 0.0, area = 0.0;
+    bool operator==(const T_REBAR&) const = default;
+};
+
+/// Stiffness factors of a section at one end.
+struct T_SECT_FACTORS {
+    double area = 1.0, Asy = 1.0, Asz = 1.0, J = 1.0, Iyy = 1.0, Izz = 1.0;
+    bool operator==(const T_SECT_FACTORS&) const = default;
+};
+
+struct T_SECT_D {
+    std::string name;
+    SECT_SHAPE shape = SECT_SHAPE::Value;
+    /// Rectangle: height, width. Circle: diameter. Pipe: diameter, wall. Box: height, width, web,
+    /// flange. I: height, flange width, web, flange. Height is along z, width along y.
+    std::array<double, 4> size{};
+    double area = 0.0, Asy = 0.0, Asz = 0.0; // area, shear areas
+    double J = 0.0, Iyy = 0.0, Izz = 0.0;    // second moments
+    double Zy = 0.0, Zz = 0.0;               // plastic moduli
+    T_SECT_FACTORS factorsI, factorsJ;
+    std::vector<T_REBAR> bars; // concrete
+    bool operator==(const T_SECT_D&) const = default;
+};
+
+// ---- elements and constraints -------------------------------------------------------------------
+
+enum class ELEM_KIND {
+    Beam,   // between two nodes, with shear deformation where the section has shear areas
+    Truss,  // axial force alone
+    Link,   // six springs between two nodes, global axes
+    Spring, // six springs between a node and the ground, global axes
+};
+
+/// Which of the six directions, in the order X, Y, Z, RX, RY, RZ.
+using T_DIRS6 = std::array<bool, 6>;
+
+struct T_ELEM_D {
+    int id = 0;
+    int nodeI = 0, nodeJ = 0;      // of a spring nodeI alone
+    int section = 0, material = 0; // keys
+    int member = 0;                // elements of one member share the number; 0: alone
+    ELEM_KIND kind = ELEM_KIND::Beam;
+    /// Local z is the part of this vector normal to the element; zero: global Z, global X for a
+    /// vertical element. Local x runs from I to J.
+    std::array<double, 3> zAxis{};
+    T_ENDS<T_DIRS6> release{};              // of a beam, local axes: no force is carried there
+    T_ENDS<std::array<double, 3>> offset{}; // of a beam, rigid, from the node to the end, global
+    std::array<double, 6> stiffness{};      // of a link or spring: 3 force / length, 3 moment
+    bool operator==(const T_ELEM_D&) const = default;
+};
+
+/// Nodes that move as one rigid body in the plane normal to an axis.
+struct T_DIAP_D {
+    std::vector<int> nodes;
+    int normal = 2; // 0 X, 1 Y, 2 Z
+    bool operator==(const T_DIAP_D&) const = default;
+};
+
+/// Nodes whose displacements in these directions are equal.
+struct T_EQDS_D {
+    std::vector<int> nodes;
+    T_DIRS6 directions{};
+    bool operator==(const T_EQDS_D&) const = default;
+};

@@ -1,0 +1,109 @@
+#include "qm_rps/pushoverhingedatatype.h"
+
+#include "qm_base/msgfunction.h"
+#include "qm_rps/hingemirror.h"
+#include "qm_rps/po_hingetypelistdlg.h"
+
+namespace {
+
+using B = T_BACKBONE;
+constexpr const char* kDiagram = "IDS_PUSHOVER_Wrong_Data_in_the_Hinge_Diagram_Table_";
+constexpr const char* kAcceptance = "IDS_PUSHOVER_Wrong_Data_in_Acceptance_Criteria_";
+
+// clang-format off
+/// A is the origin: B does not lie before it, in either measure.
+const T_RULE<B> kFromOrigin[] = {
+    {{kDiagram, RULE_TEXT::Deform, "%s(A) <= %s(B)", nullptr, "sides.pos.B.deform", HINGE_SIDE::Positive, "B"},
+     [](const B& b) { return NotAbove(0, b.pos.B.deform); }},
+    {{kDiagram, RULE_TEXT::Deform, "%s(-B) <= %s(A)", nullptr, "sides.neg.B.deform", HINGE_SIDE::Negative, "B"},
+     [](const B& b) { return NotAbove(b.neg.B.deform, 0); }, [](const B& b) { return !b.symmetric; }},
+};
+// clang-format on
+
+/// Rules of the FEMA curve under the message of a table.
+void Walk(T_BACKBONE_RULES rules, const B& data, const T_PLACE& place, const char* key,
+          std::vector<T_FINDING>& out)
+{
+    const std::size_t first = out.size();
+    WalkRules(rules, data, place, out);
+    for (std::size_t i = first; i < out.size(); ++i) {
+        out[i].messageKey = key;
+        out[i].text = zql::lib::MMSGFunction::GetValue(key);
+    }
+}
+
+constexpr T_SKEL_POINT T_SKEL_SIDE::*kPoints[] = {&T_SKEL_SIDE::B, &T_SKEL_SIDE::C, &T_SKEL_SIDE::D,
+                                                  &T_SKEL_SIDE::E};
+constexpr double T_SKEL_SIDE::*kValues[] = {&T_SKEL_SIDE::IO, &T_SKEL_SIDE::LS, &T_SKEL_SIDE::CP};
+constexpr std::size_t kOrigin = 4; // the row of A
+
+} // namespace
+
+int CPushOverHingeDataType::Data2Dlg(int key, HINGE_COMPONENT component)
+{
+    const std::optional<T_PHGT_D> type = key != 0 && m_find ? m_find(key) : std::nullopt;
+    if (const auto fault = CPO_HingeTypeListDlg::ChoiceFault(key, type.has_value())) {
+        ShowMessage(fault->key, fault->text);
+        return 0;
+    }
+    const T_HINGE_COMPONENT& c = type->components[static_cast<std::size_t>(component)];
+    if (!std::holds_alternative<T_SKEL_FEMA>(c.curves.I)) return 0;
+    m_key = key;
+    m_component = component;
+    m_type = *type;
+    m_taken = true;
+    return 1;
+}
+
+T_SKEL_FEMA* CPushOverHingeDataType::Curve()
+{
+    if (!m_taken) return nullptr;
+    return std::get_if<T_SKEL_FEMA>(
+        &m_type.components[static_cast<std::size_t>(m_component)].curves.I);
+}
+
+T_SKEL_POINT* CPushOverHingeDataType::Point(std::size_t row)
+{
+    T_SKEL_FEMA* curve = Curve();
+    if (!curve || row == kOrigin || row >= kRows.size()) return nullptr;
+    T_SKEL_SIDE& side = row > kOrigin ? curve->sides.pos : curve->sides.neg;
+    return &(side.*kPoints[row > kOrigin ? row - kOrigin - 1 : kOrigin - 1 - row]);
+}
+
+double* CPushOverHingeDataType::Criterion(std::size_t index, bool positive)
+{
+    T_SKEL_FEMA* curve = Curve();
+    if (!curve || index >= kCriteria.size()) return nullptr;
+    T_SKEL_SIDE& side = positive ? curve->sides.pos : curve->sides.neg;
+    return &(side.*kValues[index]);
+}
+
+std::vector<T_FINDING> CPushOverHingeDataType::Findings() const
+{
+    std::vector<T_FINDING> out;
+    if (!m_taken) return out;
+    const T_HINGE_COMPONENT& c = m_type.components[static_cast<std::size_t>(m_component)];
+    const auto& f = std::get<T_SKEL_FEMA>(c.curves.I);
+    const B data{f.sides.pos,     f.sides.neg,     f.symmetric,
+                 f.strengthLoss,  f.autoYield,     f.measure == SKEL_MEASURE::DDy,
+                 f.initStiffness, f.asymStiffness, &f,
+                 f.compliance};
+    const T_PLACE place{static_cast<int>(m_component)};
+    for (const T_BACKBONE_RULES& rules : {PositiveSignRules(), NegativeSignRules(),
+                                          T_BACKBONE_RULES(kFromOrigin), FemaOrderRules()})
+        Walk(rules, data, place, kDiagram, out);
+    Walk(AcceptanceRules(), data, place, kAcceptance, out);
+    return out;
+}
+
+int CPushOverHingeDataType::OnOK()
+{
+    if (!m_taken || !CheckData()) return 0;
+    if (const auto fault = CPO_HingeTypeListDlg::ChoiceFault(m_key, m_find(m_key).has_value())) {
+        ShowMessage(fault->key, fault->text);
+        return 0;
+    }
+    T_HINGE_COMPONENT& c = m_type.components[static_cast<std::size_t>(m_component)];
+    c = MirroredComponent(c);
+    return m_store ? m_store(m_key, m_type) : 0;
+}

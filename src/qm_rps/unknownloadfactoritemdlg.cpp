@@ -1,0 +1,237 @@
+#include "qm_rps/unknownloadfactoritemdlg.h"
+
+#include "qm_base/messagehistory.h"
+#include "qm_base/msgfunction.h"
+#include "qm_base/textformat.h"
+#include "qm_rps/ulfchecks.h"
+
+#include <algorithm>
+
+using zql::lib::MMSGFunction;
+
+namespace {
+
+std::string Flag(bool on)
+{
+    return on ? "1" : "0";
+}
+
+void WriteHistory(const char* key)
+{
+    GSaveHistoryFormatNF("%s", MMSGFunction::GetValue(key).c_str());
+}
+
+} // namespace
+
+CUnknownLoadFactorItemDlg::CUnknownLoadFactorItemDlg(CDBDoc& doc, int key)
+    : m_doc(doc), m_key(key), m_source(doc),
+      m_cache(m_source, [this] { return m_source.Revision(); })
+{
+    T_ULFI_D item;
+    if (!m_doc.Attr().GetUlfi(key, item)) {
+        m_key = 0;
+        const std::vector<int> combinations = m_doc.Attr().GetLcomKeys();
+        if (!combinations.empty()) item.combination = combinations.front();
+    }
+    Data2Dlg(item);
+}
+
+std::optional<T_LCOM_D> CUnknownLoadFactorItemDlg::Normalised(int combination) const
+{
+    T_LCOM_D record, flat;
+    const CAttrCtrl& attr = m_doc.Attr();
+    if (!attr.GetLcom(combination, record) || !attr.NormalizeLcom(record, flat))
+        return std::nullopt;
+    return flat;
+}
+
+void CUnknownLoadFactorItemDlg::Data2Dlg(const T_ULFI_D& item)
+{
+    m_name = item.name;
+    m_objective = item.objective;
+    m_sign = item.sign;
+    m_solveByEquations = item.solveByEquations;
+    m_cases.clear();
+    m_strangers = item.unknowns;
+    OnSelChangeCombination(item.combination);
+
+    m_checks.clear();
+    m_missing.clear();
+    for (const auto& [key, constraint] : m_doc.Data().Model().ulfConstraints) {
+        const auto& names = item.constraints;
+        const bool checked = std::find(names.begin(), names.end(), constraint.name) != names.end();
+        m_checks.push_back({constraint.name, checked});
+    }
+    for (const std::string& name : item.constraints)
+        if (FindUlfConstraint(m_doc.Data().Model(), name) == 0) m_missing.push_back(name);
+}
+
+void CUnknownLoadFactorItemDlg::OnSelChangeCombination(int key)
+{
+    std::vector<T_ULFI_UNKNOWN> before = Record().unknowns;
+    m_combination = key;
+    m_cases.clear();
+    if (const std::optional<T_LCOM_D> flat = Normalised(key))
+        for (const T_LCOM_ITEM& entry : flat->items) {
+            T_STLD_D loadCase;
+            if (!m_doc.Attr().GetStld(entry.key, loadCase)) continue;
+            T_ULF_CASE row{entry.key, loadCase.name, entry.factor};
+            const auto it = std::find_if(before.begin(), before.end(),
+                                         [&](const auto& u) { return u.loadCase == entry.key; });
+            if (it != before.end()) {
+                row.unknown = true;
+                row.weight = it->weight;
+                before.erase(it);
+            }
+            m_cases.push_back(std::move(row));
+        }
+    m_strangers = std::move(before);
+}
+
+T_ULFI_D CUnknownLoadFactorItemDlg::Record() const
+{
+    T_ULFI_D item{m_name, m_combination, m_objective, m_sign, m_solveByEquations, {}, {}};
+    for (const T_ULF_CASE& c : m_cases)
+        if (c.unknown) item.unknowns.push_back({c.key, c.weight});
+    item.unknowns.insert(item.unknowns.end(), m_strangers.begin(), m_strangers.end());
+    for (const T_CHECK& check : m_checks)
+        if (check.checked) item.constraints.push_back(check.name);
+    item.constraints.insert(item.constraints.end(), m_missing.begin(), m_missing.end());
+    return item;
+}
+
+int CUnknownLoadFactorItemDlg::Dlg2Data(T_ULFI_D& item)
+{
+    if (!CheckData()) return 0;
+    item = Record();
+    return 1;
+}
+
+std::string CUnknownLoadFactorItemDlg::CellText(std::size_t row, COLUMN column) const
+{
+    if (row >= m_cases.size()) return {};
+    const T_ULF_CASE& c = m_cases[row];
+    switch (column) {
+    case LoadCase:
+        return c.name;
+    case Unknown:
+        return Flag(c.unknown);
+    case Known:
+        return Flag(!c.unknown);
+    case Factor:
+        return FormatText("%.3f", c.factor);
+    default:
+        return FormatText("%.6f", c.weight);
+    }
+}
+
+int CUnknownLoadFactorItemDlg::SetCell(std::size_t row, COLUMN column, const std::string& text)
+{
+    if (row >= m_cases.size()) return 0;
+    T_ULF_CASE& c = m_cases[row];
+    if (column == Unknown && (text == "0" || text == "1")) {
+        c.unknown = text == "1";
+        return 1;
+    }
+    const std::optional<double> number = ParseFinite(text);
+    if (column != Weight || !number) return 0;
+    // The shown text handed back keeps the digits that it does not show.
+    if (text != CellText(row, Weight)) c.weight = *number;
+    return 1;
+}
+
+std::vector<T_FINDING> CUnknownLoadFactorItemDlg::Findings() const
+{
+    std::optional<std::vector<T_LCOM_ITEM>> cases;
+    if (const std::optional<T_LCOM_D> flat = Normalised(m_combination)) cases = flat->items;
+    return CheckUlfItem(Record(), m_key, m_doc.Data().Model(), cases);
+}
+
+int CUnknownLoadFactorItemDlg::CheckData()
+{
+    const std::vector<T_FINDING> found = Findings();
+    if (found.empty()) return 1;
+    ShowMessage(found.front().messageKey, found.front().text);
+    return 0;
+}
+
+int CUnknownLoadFactorItemDlg::OnOK()
+{
+    T_ULFI_D item;
+    if (!Dlg2Data(item)) return 0;
+    const T_TABLE<T_ULFI_D>& table = m_doc.Data().Model().ulfItems;
+    const int key = m_key ? m_key : table.empty() ? 1 : table.rbegin()->first + 1;
+    CEditData& edit = m_doc.Edit();
+    if (!edit.Begin(item.name)) return 0;
+    if (!edit.Put(key, item) || !edit.Commit()) {
+        edit.Rollback();
+        return 0;
+    }
+    m_key = key;
+    return 1;
+}
+
+int CUnknownLoadFactorItemDlg::ReadRun(T_ULF_RUN& run) const
+{
+    run.item = Record();
+    run.cases = m_cases;
+    for (const std::string& name : run.item.constraints) {
+        T_ULFC_D constraint;
+        if (!m_doc.Attr().GetUlfc_(name, constraint)) return 0;
+        run.constraints.push_back(std::move(constraint));
+    }
+    run.formed = FormUlfProblem(run.item, run.cases, run.constraints);
+    return 1;
+}
+
+int CUnknownLoadFactorItemDlg::OnCalculate()
+{
+    m_result.reset();
+    m_run.reset();
+    T_ULF_RUN run;
+    if (!CheckData() || !ReadRun(run)) return 0;
+
+    COptDsgn optimizer(m_cache);
+    optimizer.m_dump = {m_dump, m_doc.Path(),
+                        [this] { return AskYesNo("IDS_QM_ULF_DUMP_EXISTS"); }};
+    // The matrix of all cases comes from the cache, also when there is no solution to explain.
+    const bool found = optimizer.Run(run.formed.problem, run.answer) != 0;
+    const bool solved =
+        ReadUlfInfluence(run.cases, run.constraints, m_cache, run.influence) && found;
+    m_run = run;
+    if (!solved) {
+        constexpr const char* key = "IDS_RPS_Unknown_Load_Factor_Item_has_an_error";
+        ShowMessage(key, MMSGFunction::Format(key, {m_name, FailureText(run)}));
+        WriteHistory("IDS_RPS_Unknown_CANNOT_FIND_OPTIMIZED_SOLUTION");
+        return 0;
+    }
+    m_result = UlfResultOf(run, run.answer.factors);
+    WriteHistory("IDS_RPS_Unknown_CAN_FIND_OPTIMIZED_SOLUTION");
+    ReportMisses();
+    return 1;
+}
+
+/// The optimizer's message with the name of the constraint or load case that it numbers.
+std::string CUnknownLoadFactorItemDlg::FailureText(const T_ULF_RUN& run) const
+{
+    const T_OPT_ANSWER& a = run.answer;
+    if (a.message.empty()) return m_cache.Error();
+    std::string name;
+    if (a.constraint > 0)
+        name = run.constraints[run.formed.owner[static_cast<std::size_t>(a.constraint - 1)]].name;
+    else if (a.factor > 0)
+        name = run.cases[run.formed.unknowns[static_cast<std::size_t>(a.factor - 1)]].name;
+    return name.empty() ? a.message : a.message + " (" + name + ")";
+}
+
+void CUnknownLoadFactorItemDlg::ReportMisses()
+{
+    std::string names;
+    for (const T_ULF_RESULT_ROW& row : UlfResultRows(*m_result))
+        if (!row.met) names += (names.empty() ? "" : ", ") + row.name;
+    if (names.empty()) return;
+    constexpr const char* key = "IDS_QM_ULF_NOT_MET";
+    const std::string text = MMSGFunction::Format(key, {names});
+    ShowMessage(key, text);
+    GSaveHistoryFormatNF("%s", text.c_str());
+}

@@ -1,0 +1,91 @@
+// Model of the dialog of one unknown load factor item: its load cases, objective, sign and
+// constraints, and the calculation of its factors.
+#pragma once
+
+#include "qm_base/mdialog.h"
+#include "qm_db/dbdoc.h"
+#include "qm_rps/hingefindings.h"
+#include "qm_rps/ulfinfluencecache.h"
+#include "qm_rps/ulfresult.h"
+#include "qm_rps/ulfstaticresponse.h"
+
+class CUnknownLoadFactorItemDlg : public zql::frx::MDialog {
+public:
+    /// Columns of the load case grid; flags are "1" and "0".
+    enum COLUMN { LoadCase, Unknown, Known, Factor, Weight };
+    static constexpr std::array<const char*, 5> kHeads{
+        "IDS_RPS_GXGRID_LCase", "IDS_RPS_GXGRID_Unknown", "IDS_RPS_GXGRID_known",
+        "IDS_RPS_GXGRID_Factor", "IDS_RPS_GXGRID_Weighted_Factor"};
+    /// Texts of the choices, by index.
+    static constexpr std::array<const char*, 3> kObjectiveKeys{
+        "IDS_QM_ULF_LINEAR", "IDS_QM_ULF_SQUARE", "IDS_QM_ULF_MIN_MAX"};
+    static constexpr std::array<const char*, 3> kSignKeys{"IDS_QM_ULF_NEGATIVE", "IDS_QM_ULF_FREE",
+                                                          "IDS_QM_ULF_POSITIVE"};
+
+    struct T_CHECK {
+        std::string name; // of a constraint of the model
+        bool checked = false;
+        bool operator==(const T_CHECK&) const = default;
+    };
+
+    /// The document must outlive the dialog. key: of the item to edit, 0 for a new one, which
+    /// starts with the model's first combination.
+    explicit CUnknownLoadFactorItemDlg(CDBDoc& doc, int key = 0);
+
+    void Data2Dlg(const T_ULFI_D& item);
+    /// The item as edited, unchecked.
+    T_ULFI_D Record() const;
+    /// Checks, then writes. 0: a message was shown, `item` as it was.
+    [[nodiscard]] int Dlg2Data(T_ULFI_D& item);
+
+    std::string m_name;
+    int m_objective = 0; // index of kObjectiveKeys
+    int m_sign = 1;      // index of kSignKeys
+    bool m_solveByEquations = false;
+    std::vector<T_CHECK> m_checks; // all constraints of the model
+
+    int Combination() const { return m_combination; }
+    /// Another combination: its load cases; flags and weights of cases that both have stay.
+    void OnSelChangeCombination(int key);
+
+    const std::vector<T_ULF_CASE>& Cases() const { return m_cases; }
+    /// Text of a cell: factors as "%.3f", weights as "%.6f".
+    std::string CellText(std::size_t row, COLUMN column) const;
+    /// Takes an edited cell: the unknown flag or the weight. 0: no such cell, or not a finite
+    /// number; the cell as it was.
+    [[nodiscard]] int SetCell(std::size_t row, COLUMN column, const std::string& text);
+
+    /// Rules that are not kept, in the order of the check; CheckData shows the first.
+    std::vector<T_FINDING> Findings() const;
+    int CheckData() override;
+    /// Checks, then stores the item as one edit that can be undone. 0: refused, nothing stored.
+    int OnOK() override;
+    int Key() const { return m_key; }
+
+    /// The calculation. 1: Result() has the factors; constraints that equations could not meet to
+    /// 1e-6 are named in a message. 0: refused or not solved, with a message, and no result kept.
+    /// Either outcome goes to the message history.
+    [[nodiscard]] int OnCalculate();
+    const std::optional<T_ULF_RESULT>& Result() const { return m_result; }
+    /// Of the latest calculation that reached the optimizer, for its explanation.
+    const std::optional<T_ULF_RUN>& LastRun() const { return m_run; }
+
+    bool m_dump = false; // debug: write the problem handed to the solver beside the model file
+
+private:
+    std::optional<T_LCOM_D> Normalised(int combination) const;
+    int ReadRun(T_ULF_RUN& run) const;
+    std::string FailureText(const T_ULF_RUN& run) const;
+    void ReportMisses();
+
+    CDBDoc& m_doc;
+    int m_key = 0;
+    int m_combination = 0;
+    std::vector<T_ULF_CASE> m_cases;
+    std::vector<T_ULFI_UNKNOWN> m_strangers; // unknown cases that the combination does not have
+    std::vector<std::string> m_missing;      // constraints that the item names and the model lacks
+    CUlfStaticResponse m_source;
+    CUlfInfluenceCache m_cache;
+    std::optional<T_ULF_RUN> m_run;
+    std::optional<T_ULF_RESULT> m_result;
+};

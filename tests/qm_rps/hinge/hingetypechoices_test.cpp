@@ -1,0 +1,237 @@
+// What the hinge type editor offers and what its buttons do.
+#include "hingesample.h"
+#include "qm_rps/po_hingeintegrationpointdlg.h"
+#include "qm_rps/po_hingelengthmthetadlg.h"
+#include "qm_rps/po_hingemasonrydlg.h"
+#include "qm_rps/po_hingetypedlg.h"
+#include "qm_rps/po_hingeyieldpropdlgnew.h"
+
+#include <functional>
+#include <gtest/gtest.h>
+
+namespace {
+
+using C = HINGE_COMPONENT;
+using P = CPO_HingeTypeDlg::PART;
+
+T_HINGE_CONTEXT Context()
+{
+    T_SECT_D values, wall, circle;
+    values.name = "values";
+    values.area = 6, values.Asy = 5, values.Asz = 4, values.J = 3, values.Iyy = 2, values.Izz = 7;
+    values.factorsI.Iyy = 0.5;
+    wall.name = "wall", wall.shape = SECT_SHAPE::Rectangle, wall.size = {3, 0.25};
+    circle.name = "round", circle.shape = SECT_SHAPE::Circle, circle.size = {1};
+    T_MATL_D m;
+    m.E = 260, m.nu = 0.3; // G = 100
+    T_HINGE_CONTEXT x;
+    x.sources = std::make_shared<CHingeSources>(
+        T_TABLE<T_SECT_D>{{1, values}, {4, wall}, {7, circle}}, T_TABLE<T_MATL_D>{{1, m}});
+    return x;
+}
+
+/// Edits the child dialog and accepts it.
+class CEditView : public zql::frx::IDialogView {
+public:
+    std::function<void(zql::frx::MDialog&)> m_edit;
+    void ShowMessage(const std::string&, const std::string&) override {}
+    bool AskYesNo(const std::string&, const std::string&) override { return false; }
+    int RunModal(zql::frx::MDialog& child) override
+    {
+        if (m_edit) m_edit(child);
+        return m_edit ? 1 : 0;
+    }
+};
+
+std::string Keys(const CPO_HingeTypeDlg::T_REF_LIST& list)
+{
+    std::string text;
+    for (const auto& entry : list)
+        text += entry.text + ";";
+    return text;
+}
+
+/// "s" shown, "e" enabled as well.
+std::string ModeOf(const T_PHGT_D& type)
+{
+    CPO_HingeTypeDlg dlg(Context());
+    dlg.Data2Dlg(type);
+    std::string text;
+    for (const auto& part : dlg.CustomizeDlgByMode())
+        text += part.enabled ? 'e' : part.shown ? 's' : '-';
+    return text;
+}
+
+} // namespace
+
+TEST(HingeTypeLists, OfferSectionsByTheirShape)
+{
+    CPO_HingeTypeDlg dlg(Context());
+    EXPECT_EQ("4 : wall;7 : round;", Keys(dlg.InitFiberCombo_Fibr()));
+    EXPECT_EQ("4 : wall;", Keys(dlg.InitFiberCombo_Fibw()));
+    EXPECT_EQ("4 : 0.25;", Keys(dlg.InitPropCombo_Thik()));
+    EXPECT_EQ("1 : values;4 : wall;7 : round;", Keys(dlg.InitPropCombo_Sect()));
+    dlg.OnSelChangeElement(HINGE_ELEMENT::Wall);
+    EXPECT_EQ("4 : wall;", Keys(dlg.InitPropCombo_Sect()));
+    dlg.OnUpdate({}); // the document lost its sections
+    EXPECT_EQ("", Keys(dlg.InitPropCombo_Sect()));
+}
+
+// Order: interaction, yield surface, user interaction, section, thickness, fibres of frames and of
+// walls, integration points, hinge length, location, masonry, infill strut.
+TEST(HingeTypeMode, FollowsElementDefinitionAndInteraction)
+{
+    T_PHGT_D t;
+    EXPECT_EQ("ssse----se--", ModeOf(t));
+    t.components[4].active = true;
+    t.interaction = HINGE_INTERACTION::PMM;
+    EXPECT_EQ("eese----se--", ModeOf(t));
+    t.interaction = HINGE_INTERACTION::User;
+    t.material = MATL_CLASS::Masonry;
+    EXPECT_EQ("esee----see-", ModeOf(t));
+    t.element = HINGE_ELEMENT::Wall;
+    t.definition = HINGE_DEFINITION::CurvatureDistributed;
+    EXPECT_EQ("eseee-eesee-", ModeOf(t));
+    t.element = HINGE_ELEMENT::Truss;
+    EXPECT_EQ("---e-e-----s", ModeOf(t));
+    t.components[0].active = true; // the FEMA curve alone is offered there
+    EXPECT_EQ("---e-e-----e", ModeOf(t));
+    t.element = HINGE_ELEMENT::PointSpring;
+    EXPECT_EQ("------------", ModeOf(t));
+    EXPECT_FALSE(CPO_HingeTypeDlg::HasComponent(HINGE_ELEMENT::Truss, C::My));
+}
+
+TEST(HingeTypeLabels, NameTheModelOfABendingComponent)
+{
+    const auto label = CPO_HingeTypeDlg::HingeModelLabel;
+    EXPECT_EQ("Moment - Rotation (M-Ry)", label(HINGE_DEFINITION::MomentRotation, C::My));
+    EXPECT_EQ("Moment - Curvature (M-Rz Lumped)", label(HINGE_DEFINITION::CurvatureLumped, C::Mz));
+    EXPECT_EQ("Moment - Curvature (M-Rx Distributed)",
+              label(HINGE_DEFINITION::CurvatureDistributed, C::Mx));
+    EXPECT_EQ("", label(HINGE_DEFINITION::MomentRotation, C::Fz));
+}
+
+// By hand: E = 260, G = 100, L = 2; A = 6, Asy = 5, Asz = 4, J = 3, Iyy = 2 (0.5 at I), Izz = 7.
+TEST(HingeTypeStiffness, ComesFromSectionMaterialAndLength)
+{
+    T_PHGT_D t;
+    t.section = t.sectionMaterial = 1;
+    const INIT_STIFFNESS options[] = {INIT_STIFFNESS::Elastic, INIT_STIFFNESS::Elastic,
+                                      INIT_STIFFNESS::EI6L,    INIT_STIFFNESS::EI6L,
+                                      INIT_STIFFNESS::EI3L,    INIT_STIFFNESS::User};
+    for (std::size_t i = 0; i < 6; ++i) {
+        T_SKEL_MULTI m;
+        m.initStiffness = options[i];
+        m.sides.pos.userStiffness = 11, m.sides.neg.userStiffness = 12;
+        m.symmetric = i != 5;
+        t.components[i] = ComponentWith(SKEL_TYPE::Bilinear, m);
+    }
+    t.components[4].sameEnds = false;
+    const auto rows = [&](double length) {
+        CPO_HingeTypeDlg dlg(Context());
+        dlg.Data2Dlg(t);
+        return dlg.UpdateInitialStiffness(length);
+    };
+    const auto all = rows(2);
+    ASSERT_EQ(7u, all.size());
+    EXPECT_DOUBLE_EQ(780, *all[0].stiffness.pos);   // E A / L
+    EXPECT_DOUBLE_EQ(500, *all[1].stiffness.pos);   // G Asy
+    EXPECT_FALSE(all[2].stiffness.pos.has_value()); // no bending stiffness of a shear
+    EXPECT_DOUBLE_EQ(150, *all[3].stiffness.neg);   // G J / L
+    EXPECT_DOUBLE_EQ(390, *all[4].stiffness.pos);   // 3 E 0.5 Iyy / L at the I-end
+    EXPECT_DOUBLE_EQ(780, *all[5].stiffness.pos);   // at the J-end
+    EXPECT_EQ(11, *all[6].stiffness.pos);
+    EXPECT_EQ(12, *all[6].stiffness.neg);
+    t.length.autoSpan = false, t.length.span = 4;
+    EXPECT_DOUBLE_EQ(195, *rows(2)[4].stiffness.pos);
+    t.length.autoSpan = true;
+    EXPECT_FALSE(rows(0)[4].stiffness.pos.has_value());
+    t.sectionMaterial = 2; // missing
+    EXPECT_FALSE(rows(2)[0].stiffness.pos.has_value());
+    EXPECT_EQ(11, *rows(2)[6].stiffness.pos);
+}
+
+TEST(HingeTypeDefaults, PutActiveComponentsBack)
+{
+    T_PHGT_D t;
+    for (const std::size_t i : {0u, 4u, 5u})
+        t.components[i] = ComponentWith(SKEL_TYPE::Fema, ValidBackbone<T_SKEL_FEMA>());
+    t.components[5].active = false;
+    CPO_HingeTypeDlg dlg({});
+    dlg.Data2Dlg(t);
+    dlg.InitDataCheckedAll();
+    const auto& now = dlg.Type().components;
+    EXPECT_EQ(SKEL_TYPE::Bilinear, now[0].type);
+    EXPECT_EQ(HINGE_LOCATION::Center, now[0].location);
+    EXPECT_EQ(INIT_STIFFNESS::Elastic, std::get<T_SKEL_MULTI>(now[0].curves.I).initStiffness);
+    EXPECT_TRUE(now[4].active);
+    EXPECT_EQ(HINGE_LOCATION::BothEnds, now[4].location);
+    EXPECT_EQ(INIT_STIFFNESS::EI6L, std::get<T_SKEL_MULTI>(now[4].curves.J).initStiffness);
+    EXPECT_EQ(t.components[5], now[5]);
+}
+
+TEST(HingeTypeButtons, TakeWhatIsAcceptedAlone)
+{
+    CEditView view;
+    CPO_HingeTypeDlg dlg({});
+    dlg.SetView(&view);
+    const T_PHGT_D before = dlg.Type();
+    EXPECT_EQ(0, dlg.OnYieldSurfaceDlgDlg() + dlg.OnUserInteractionDlg() + dlg.OnMasonryPropDlg() +
+                     dlg.OnBtnIntegrationPoint() + dlg.OnBtnHingeLength()); // cancelled
+    view.m_edit = [](zql::frx::MDialog&) {};
+    EXPECT_EQ(0, dlg.OnYieldSurfaceDlgDlg()); // zeros are no surface
+    EXPECT_EQ(0, dlg.OnMasonryPropDlg());
+    EXPECT_EQ(before, dlg.Type());
+
+    view.m_edit = [](zql::frx::MDialog& d) {
+        auto& surface = dynamic_cast<CPO_HingeYieldPropDlgNew&>(d).m_surface;
+        surface.yield.tension = 3, surface.yield.compression = 9;
+        surface.yield.y.used = surface.yield.z.used = false;
+    };
+    EXPECT_EQ(1, dlg.OnYieldSurfaceDlgDlg());
+    EXPECT_EQ(9, dlg.Type().yieldSurface->yield.compression);
+    view.m_edit = [](zql::frx::MDialog& d) {
+        dynamic_cast<CPO_HingeMasonryDlg&>(d).m_masonry = {2, 5, 1, 0, 0.5};
+    };
+    EXPECT_EQ(1, dlg.OnMasonryPropDlg());
+    EXPECT_EQ(5, dlg.Type().masonry->compStrength);
+    view.m_edit = [](zql::frx::MDialog& d) {
+        EXPECT_EQ(1, dynamic_cast<CPO_HingeIntegrationPointDlg&>(d).OnSelect(4));
+    };
+    EXPECT_EQ(1, dlg.OnBtnIntegrationPoint());
+    EXPECT_EQ(7, dlg.Type().length.integrationPoints);
+    view.m_edit = [](zql::frx::MDialog& d) {
+        dynamic_cast<CPO_HingeLengthMThetaDlg&>(d).m_My = {0.3, 0.25};
+    };
+    EXPECT_EQ(1, dlg.OnBtnHingeLength());
+    EXPECT_EQ("", dlg.GetHingeLength_MTheta(C::My)); // needed by the EC8 curve alone
+    T_PHGT_D t = dlg.Type();
+    t.components[4] = ComponentWith(SKEL_TYPE::Ec8, ValidBackbone<T_SKEL_EC8>());
+    t.length.components.J[4] = 0.5;
+    t.components[4].location = HINGE_LOCATION::JEnd;
+    dlg.Data2Dlg(t);
+    EXPECT_EQ("J 0.25", dlg.GetHingeLength_MTheta(C::My));
+    EXPECT_EQ("J 0.5", dlg.GetHingeLength_MPhi(C::My));
+}
+
+TEST(HingeTypeApply, StoresATypeThatPasses)
+{
+    T_PHGT_D stored;
+    CPO_HingeTypeDlg dlg({});
+    EXPECT_EQ(0, dlg.OnApply()); // no name
+    dlg.SetName("beam");
+    EXPECT_EQ(0, dlg.OnApply()); // nowhere to store
+    dlg.m_store = [&](const T_PHGT_D& t) {
+        stored = t;
+        return 1;
+    };
+    EXPECT_EQ(1, dlg.OnOK());
+    EXPECT_EQ("beam", stored.name);
+
+    T_SKEL_MULTI steep;
+    steep.sides.pos.alpha1 = 2;
+    stored.components[1] = stored.components[2] = ComponentWith(SKEL_TYPE::Bilinear, steep);
+    dlg.Data2Dlg(stored);
+    EXPECT_EQ(1, dlg.OnApply());
+    EXPECT_EQ("IDS_RPS_PO_MULTI_WARNING_ALPHA", dlg.Messages().back().key);
+}

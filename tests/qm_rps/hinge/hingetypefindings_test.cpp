@@ -1,0 +1,290 @@
+// Rules of a whole hinge type: what it refers to, codes, symmetry, automatic strengths, parts.
+#include "hingesample.h"
+#include "qm_rps/hingemirror.h"
+#include "qm_rps/hingepreview.h"
+#include "qm_rps/hingetypefindings.h"
+#include "qm_rps/po_hingeskcvtabfemadlg.h"
+
+#include <functional>
+#include <gtest/gtest.h>
+
+namespace {
+
+constexpr const char* kNoSect = "IDS_CMD_IEHP_NO_SECT";
+constexpr const char* kNoMatl = "IDS_CMD_IEHP_NO_MATL";
+constexpr const char* kNoWall = "IDS_CMD_IEHP_NO_WALL";
+constexpr const char* kAuto = "IDS_QM_HINGE_AUTO_STRENGTH";
+constexpr const char* kSymmetry = "IDS_QM_HINGE_NOT_SYMMETRIC";
+
+/// Sections 1 by values, 2 rectangle, 3 circle, 4 rectangle with bars. Materials 1 steel,
+/// 2 concrete, 3 masonry.
+T_HINGE_CONTEXT Context()
+{
+    T_SECT_D values, wall, circle, column;
+    values.area = 3, values.Asy = values.Asz = 1, values.Zy = values.Zz = 2;
+    values.Iyy = values.Izz = values.J = 1;
+    wall.shape = SECT_SHAPE::Rectangle, wall.size = {300, 200};
+    circle.shape = SECT_SHAPE::Circle, circle.size = {300};
+    column = wall;
+    column.bars = {{80, 120, 300}, {-80, 120, 300}, {80, -120, 300}, {-80, -120, 300}};
+    T_MATL_D steel, concrete, masonry;
+    steel.Fy = 275;
+    concrete.type = MATL_CLASS::Concrete, concrete.fck = 25, concrete.fyk = 450;
+    concrete.Es = 200000;
+    masonry.type = MATL_CLASS::Masonry, masonry.fck = 3;
+    T_HINGE_CONTEXT x;
+    x.concreteCode = "Eurocode2:04";
+    x.steelCode = "Eurocode3";
+    x.sources = std::make_shared<CHingeSources>(
+        T_TABLE<T_SECT_D>{{1, values}, {2, wall}, {3, circle}, {4, column}},
+        T_TABLE<T_MATL_D>{{1, steel}, {2, concrete}, {3, masonry}});
+    return x;
+}
+
+T_PHGT_D Type(HINGE_COMPONENT c = HINGE_COMPONENT::My)
+{
+    T_PHGT_D t;
+    t.name = "column";
+    t.components[static_cast<std::size_t>(c)] =
+        ComponentWith(SKEL_TYPE::Fema, ValidBackbone<T_SKEL_FEMA>());
+    return t;
+}
+T_SKEL_FEMA& Fema(T_PHGT_D& t, HINGE_COMPONENT c = HINGE_COMPONENT::My)
+{
+    return std::get<T_SKEL_FEMA>(t.components[static_cast<std::size_t>(c)].curves.I);
+}
+void Automatic(T_PHGT_D& t, int section, int material)
+{
+    Fema(t).autoYield = true;
+    t.section = section;
+    t.sectionMaterial = material;
+}
+/// My with a symmetric curve of which both sides are stored.
+void Symmetric(T_PHGT_D& t)
+{
+    T_SKEL_FEMA& f = Fema(t);
+    f.symmetric = true;
+    T_SKEL_SIDE& n = f.sides.neg;
+    const T_SKEL_SIDE& p = f.sides.pos;
+    n.yield = p.yield, n.yieldDeform = p.yieldDeform;
+    n.B = {-1, -1}, n.C = {-6, -1.2}, n.D = {-6, -0.2}, n.E = {-8, -0.2};
+    n.IO = -2, n.LS = -4, n.CP = -6;
+}
+
+struct T_CASE {
+    const char* label;
+    std::function<void(T_PHGT_D&)> edit;
+    const char* key = nullptr; // of the only finding; null: none
+    const char* field = "";
+};
+
+void Expect(const std::vector<T_CASE>& cases, const T_HINGE_CONTEXT& context)
+{
+    for (const T_CASE& c : cases) {
+        SCOPED_TRACE(c.label);
+        T_PHGT_D t = Type();
+        c.edit(t);
+        const auto found = HingeTypeFindings(t, context);
+        ASSERT_EQ(c.key ? 1u : 0u, found.size()) << (found.empty() ? "" : found[0].text);
+        if (!c.key) continue;
+        EXPECT_EQ(c.key, found[0].messageKey);
+        EXPECT_EQ(c.field, found[0].field);
+    }
+}
+
+using T = T_PHGT_D;
+constexpr auto kWall = HINGE_ELEMENT::Wall;
+
+} // namespace
+
+TEST(HingeTypeFindings, ReferencesExistAndFitTheElement)
+{
+    Expect(
+        {
+            {"none", [](T&) {}},
+            {"fibres of a frame", [](T& t) { t.fibreSection = 3; }},
+            {"missing", [](T& t) { t.fibreSection = 9; }, kNoSect, "fibreSection"},
+            {"without shape", [](T& t) { t.fibreSection = 1; }, "IDS_QM_HINGE_FIBRE_SHAPE",
+             "fibreSection"},
+            {"fibres of a wall", [](T& t) { t.element = kWall, t.fibreSection = 2; }},
+            {"round wall", [](T& t) { t.element = kWall, t.fibreSection = 3; },
+             "IDS_QM_HINGE_FIBRE_SHAPE", "fibreSection"},
+            {"link", [](T& t) { t.element = HINGE_ELEMENT::GeneralLink, t.fibreSection = 2; },
+             "IDS_QM_HINGE_NO_FIBRES", "fibreSection"},
+            {"thickness", [](T& t) { t.element = kWall, t.thicknessSection = 2; }},
+            {"thickness of a circle", [](T& t) { t.element = kWall, t.thicknessSection = 3; },
+             kNoWall, "thicknessSection"},
+            {"thickness of a frame", [](T& t) { t.thicknessSection = 2; }, kNoWall,
+             "thicknessSection"},
+            {"round wall section", [](T& t) { t.element = kWall, t.section = 3; }, kNoWall,
+             "section"},
+        },
+        Context());
+}
+
+TEST(HingeTypeFindings, AutomaticStrengthsNeedASectionAndMaterialThatGiveThem)
+{
+    Expect(
+        {
+            {"no reference: judged on the elements", [](T& t) { Automatic(t, 0, 0); }},
+            {"steel by values", [](T& t) { Automatic(t, 1, 1); }},
+            {"entered", [](T& t) { t.section = 3, t.sectionMaterial = 3; }},
+            {"no material", [](T& t) { Automatic(t, 1, 0); }, kNoMatl, "sectionMaterial"},
+            {"no section", [](T& t) { Automatic(t, 0, 1); }, kNoSect, "section"},
+            {"masonry", [](T& t) { Automatic(t, 2, 3); }, kAuto, "autoYield"},
+            {"concrete with bars", [](T& t) { Automatic(t, 4, 2); }},
+            {"concrete without bars", [](T& t) { Automatic(t, 2, 2); }, "IDS_CMD_IEHP_NO_RBAR",
+             "section"},
+            {"no method for torsion",
+             [](T& t) {
+                 std::swap(t.components[3], t.components[4]);
+                 Fema(t, HINGE_COMPONENT::Mx).autoYield = true;
+                 t.section = t.sectionMaterial = 1;
+             },
+             kAuto, "autoYield"},
+            {"not active", [](T& t) { Automatic(t, 2, 3), t.components[4].active = false; }},
+        },
+        Context());
+}
+
+TEST(HingeTypeFindings, AnEurocodeCurveNeedsTheEurocodePair)
+{
+    const auto ec8 = [](T& t) {
+        t.components[4] = ComponentWith(SKEL_TYPE::Ec8, ValidBackbone<T_SKEL_EC8>());
+    };
+    T_HINGE_CONTEXT x = Context();
+    Expect({{"Eurocode", ec8}}, x);
+    x.steelCode = "AIJ-ASD02";
+    Expect({{"mixed pair", ec8, "IDS_QM_HINGE_CURVE_CODES", "type"}}, x);
+}
+
+TEST(HingeTypeFindings, AStoredNegativeSideMustNotContradictSymmetry)
+{
+    Expect(
+        {
+            {"mirrored", Symmetric},
+            {"left out", [](T& t) { Fema(t).symmetric = true, Fema(t).sides.neg = {}; }},
+            {"energy and stiffness are its own",
+             [](T& t) {
+                 Symmetric(t);
+                 Fema(t).sides.neg.userStiffness = 9, Fema(t).sides.neg.energy = {};
+             }},
+            {"strength", [](T& t) { Symmetric(t), Fema(t).sides.neg.C.strength = -1.1999999; },
+             kSymmetry, "sides.neg.C.strength"},
+            {"sign", [](T& t) { Symmetric(t), Fema(t).sides.neg.CP = 6; }, kSymmetry,
+             "sides.neg.CP"},
+            {"yield", [](T& t) { Symmetric(t), Fema(t).sides.neg.yield = 0; }, kSymmetry,
+             "sides.neg.yield"},
+            {"multilinear gap is its own",
+             [](T& t) {
+                 T_SKEL_MULTI m;
+                 m.sides.pos = m.sides.neg = {10, 0, 0, 0, 0, 0, 0.1, 0, 0.5, 0};
+                 m.sides.neg.gap = 0;
+                 t.components[4] = ComponentWith(SKEL_TYPE::SlipBilinear, m);
+             }},
+            {"multilinear strength",
+             [](T& t) {
+                 T_SKEL_MULTI m;
+                 m.sides.pos.P1 = 10, m.sides.neg.P1 = -10; // magnitudes
+                 t.components[4] = ComponentWith(SKEL_TYPE::Bilinear, m);
+             },
+             kSymmetry, "sides.neg.P1"},
+        },
+        Context());
+}
+
+TEST(HingeTypeFindings, InactiveCriteriaAreNotChecked)
+{
+    Expect(
+        {
+            {"in use", [](T& t) { Fema(t).sides.pos.IO = 5; },
+             "IDS_RPS_Error_Pushove_Hinge_Properties_DOF_s_contains_ERROR", "sides.pos.LS"},
+            {"inactive", [](T& t) { Fema(t).sides.pos.IO = 5, Fema(t).compliance = false; }},
+        },
+        Context());
+}
+
+TEST(HingeMirror, KeepsTheGapOfEachSide)
+{
+    T_SKEL_MULTI m;
+    m.sides.pos.P1 = 10, m.sides.pos.gap = 0.5, m.sides.neg.gap = 0.25;
+    const auto c = MirroredComponent(ComponentWith(SKEL_TYPE::SlipBilinear, m));
+    const T_SKEL_MULTI_SIDE& neg = std::get<T_SKEL_MULTI>(c.curves.J).sides.neg;
+    EXPECT_EQ(10, neg.P1);
+    EXPECT_EQ(0.25, neg.gap);
+}
+
+TEST(HingeCriteria, AreShownAsInactiveAndLeaveThePicture)
+{
+    CPO_HingeSkcvTabFemaDlg dlg;
+    ASSERT_EQ(1, dlg.Data2Dlg(HINGE_COMPONENT::My, Type().components[4]));
+    const T_SKEL_FEMA& f = *dlg.Curve(HINGE_COMPONENT::My, HINGE_END::Both);
+    T_HINGE_PREVIEW preview;
+    EXPECT_EQ("2", CPO_HingeSkcvTabFemaDlg::CriterionText(f, f.sides.pos.IO));
+    ASSERT_EQ(1, BackboneOf(f, SKEL_TYPE::Fema, preview));
+    EXPECT_EQ(6u, preview.marks.size());
+    EXPECT_EQ(1, dlg.OnComplianceChk(HINGE_COMPONENT::My, HINGE_END::Both, false));
+    EXPECT_EQ(0, dlg.OnComplianceChk(HINGE_COMPONENT::Fx, HINGE_END::Both, false));
+    EXPECT_EQ("Inactive", CPO_HingeSkcvTabFemaDlg::CriterionText(f, f.sides.pos.IO));
+    ASSERT_EQ(1, BackboneOf(f, SKEL_TYPE::Fema, preview));
+    EXPECT_TRUE(preview.marks.empty());
+}
+
+TEST(HingeTypeFindings, PartsOfTheTypeAreCheckedUnderTheirNames)
+{
+    Expect(
+        {
+            {"masonry form 1",
+             [](T& t) {
+                 t.masonry = {1, 1, 1, 1, 1};
+             }},
+            {"masonry form 2",
+             [](T& t) {
+                 t.masonry = {2, 1, 1, 0, 1};
+             }},
+            {"masonry form 0",
+             [](T& t) {
+                 t.masonry = {0, 1, 1, 0, 9};
+             },
+             "IDS_QM_MASONRY_FORM", "masonry.form"},
+            {"masonry form 3",
+             [](T& t) {
+                 t.masonry = {3, 1, 1, 0, 9};
+             },
+             "IDS_QM_MASONRY_FORM", "masonry.form"},
+            {"user curves", [](T& t) { t.pmm.emplace().Pmax = 0; }},
+            {"user Pmax", [](T& t) { t.pmm.emplace().Pmax = -1e-9; }, "IDS_PUSHOVER_PMAX_POS",
+             "pmm.Pmax"},
+            {"surface without axes",
+             [](T& t) {
+                 T_YIELD_LEVEL& l = t.yieldSurface.emplace().yield;
+                 l.y.used = l.z.used = false, l.compression = 1;
+             },
+             "IDS_CMD_IEHP_YIELD", "yieldSurface.yield.tension"},
+        },
+        Context());
+}
+
+TEST(HingeTypeWarnings, RatiosMustSuitSeveralCurvesAtOnce)
+{
+    T_SKEL_MULTI m;
+    m.sides.pos.alpha1 = m.sides.neg.alpha1 = 0.1;
+    m.sides.pos.alpha2 = m.sides.neg.alpha2 = 0.1;
+    const auto warnings = [&](SKEL_TYPE type, int curves) {
+        T_PHGT_D t;
+        for (int i = 0; i < curves; ++i)
+            t.components[static_cast<std::size_t>(4 + i)] = ComponentWith(type, m);
+        return HingeTypeWarnings(t).size();
+    };
+    EXPECT_EQ(0u, warnings(SKEL_TYPE::Trilinear, 2)); // equal ratios suit
+    m.sides.pos.alpha2 = 0.11;
+    EXPECT_EQ(2u, warnings(SKEL_TYPE::Trilinear, 2));
+    EXPECT_EQ(0u, warnings(SKEL_TYPE::Trilinear, 1)); // one curve alone
+    EXPECT_EQ(0u, warnings(SKEL_TYPE::Bilinear, 2));  // alpha2 is not in use
+    m.sides.pos.alpha1 = m.sides.pos.alpha2 = 1.0;
+    EXPECT_EQ(0u, warnings(SKEL_TYPE::Bilinear, 2));
+    m.sides.pos.alpha1 = 1.001;
+    EXPECT_EQ(2u, warnings(SKEL_TYPE::Bilinear, 2));
+    m.useDeformation = true;
+    EXPECT_EQ(0u, warnings(SKEL_TYPE::Bilinear, 2));
+}

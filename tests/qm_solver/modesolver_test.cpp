@@ -1,0 +1,264 @@
+// Modes through CFrameSolver against closed forms.
+#include "qm_solver/framesolver.h"
+
+#include "frames.h"
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <numbers>
+
+namespace {
+
+using namespace sample;
+using std::numbers::pi;
+
+constexpr int X = 0, Y = 1, Z = 2, RX = 3, RY = 4, RZ = 5;
+
+std::vector<T_MODE> Modes(const T_FRAME& frame, std::size_t count)
+{
+    CFrameSolver solver;
+    T_SOLVER_ERROR error;
+    std::vector<T_MODE> modes;
+    EXPECT_EQ(1, solver.Prepare(frame, error)) << error.reason;
+    EXPECT_EQ(1, solver.Modes(count, modes, error)) << error.reason;
+    return modes;
+}
+
+/// A beam of length 6 along X in `parts` elements that moves along Z alone; its ends as stated.
+T_FRAME Beam(std::size_t parts, std::initializer_list<int> left, std::initializer_list<int> right)
+{
+    T_FRAME frame = Empty();
+    frame.materials[0].density = 7.85;
+    for (std::size_t i = 0; i <= parts; ++i)
+        Fix(frame, AddNode(frame, {6.0 * double(i) / double(parts), 0, 0}), {X, Y, RX, RZ});
+    for (std::size_t i = 0; i < parts; ++i)
+        Join(frame, ELEMENT_KIND::Beam, i, i + 1);
+    Fix(frame, 0, left);
+    Fix(frame, parts, right);
+    return frame;
+}
+
+/// omega^2 = (beta L)^4 EI / (rho A L^4).
+double BeamOmega2(double betaL)
+{
+    return std::pow(betaL / 6.0, 4) * 2.1e8 * 3.7e-5 / (7.85 * 5.4e-3);
+}
+
+TEST(Modes, OfASimpleBeamAreTheClosedFormWithTheErrorOfLumpedMass)
+{
+    // Lumping the mass replaces the integral over the beam's influence line by the trapezoidal
+    // rule. Its Euler-Maclaurin remainder at the kink of the third derivative lowers omega^2 by
+    // s^4 / 720 + 10 s^6 / 30240, s = k pi / N; the next term is 35 s^8 / 1209600.
+    constexpr double kParts = 40.0;
+    const std::vector<T_MODE> modes = Modes(Beam(40, {Z}, {Z}), 6);
+    ASSERT_EQ(6u, modes.size());
+    for (std::size_t i = 0; i < 6; ++i) {
+        const double k = double(i) + 1.0, s = k * pi / kParts;
+        const double loss = std::pow(s, 4) / 720.0 + std::pow(s, 6) / 3024.0;
+        EXPECT_NEAR(1.0 - loss, modes[i].omega2 / BeamOmega2(k * pi), 1e-9 + std::pow(s, 8) / 2e4);
+        EXPECT_NEAR(2.0 * pi / std::sqrt(modes[i].omega2), modes[i].period, 1e-12);
+        // The shape is a sampled sine: its sum is cot(s / 2), or 0, and its square sum N / 2.
+        const double sum = i % 2 == 0 ? 1.0 / std::tan(s / 2.0) : 0.0;
+        EXPECT_NEAR(200.0 * sum * sum / (kParts * (kParts - 1.0)), modes[i].massPercent[Z], 1e-7);
+    }
+}
+
+TEST(Modes, OfACantileverAreTheClosedFormWithTheErrorOfLumpedMass)
+{
+    // By Rayleigh's quotient the trapezoidal rule over v^2 lowers omega^2 by v v'(L) h^2 / 6 over
+    // the integral of v^2, which is v(L)^2 L / 4 for every mode of a cantilever.
+    const double roots[] = {1.875104068711961, 4.694091132974175, 7.854757438237613};
+    constexpr double kParts = 100.0;
+    const std::vector<T_MODE> modes = Modes(Beam(100, {Z, RY}, {}), 3);
+    ASSERT_EQ(3u, modes.size());
+    for (std::size_t i = 0; i < 3; ++i) {
+        const double b = roots[i];
+        const double ratio = (std::cosh(b) + std::cos(b)) / (std::sinh(b) + std::sin(b));
+        const double v = std::cosh(b) - std::cos(b) - ratio * (std::sinh(b) - std::sin(b));
+        const double slope =
+            b * (std::sinh(b) + std::sin(b) - ratio * (std::cosh(b) - std::cos(b)));
+        const double loss = 4.0 / 6.0 * slope / v / (kParts * kParts);
+        EXPECT_NEAR(1.0 - loss, modes[i].omega2 / BeamOmega2(b), 0.02 * loss) << i;
+    }
+}
+
+/// Storeys of equal mass 2 and stiffness 500 in X (and Y if `both`), held at the foot.
+T_FRAME ShearBuilding(std::size_t storeys, bool both)
+{
+    T_FRAME frame = Empty();
+    for (std::size_t i = 0; i <= storeys; ++i) {
+        AddNode(frame, {0, 0, 0}); // storeys in one place: a link does not feel the height
+        frame.nodes[i].mass = {2.0, both ? 2.0 : 0.0, 0.0};
+        if (i > 0)
+            Join(frame, ELEMENT_KIND::Link, i - 1, i, {500.0, both ? 500.0 : 0.0, 0, 0, 0, 0});
+    }
+    Fix(frame, 0, {X, Y, Z, RX, RY, RZ});
+    return frame;
+}
+
+double ShearOmega2(std::size_t storeys, std::size_t mode)
+{
+    const double angle = (2.0 * double(mode) - 1.0) * pi / (2.0 * (2.0 * double(storeys) + 1.0));
+    return 4.0 * 500.0 / 2.0 * std::pow(std::sin(angle), 2);
+}
+
+TEST(Modes, OfAShearBuildingAreTheClosedForm)
+{
+    for (std::size_t storeys : {1u, 2u, 9u, 2500u}) { // the last one by iteration
+        const std::size_t count = std::min<std::size_t>(storeys, 12);
+        const std::vector<T_MODE> modes = Modes(ShearBuilding(storeys, false), count);
+        ASSERT_EQ(count, modes.size());
+        double percent = 0.0;
+        for (std::size_t i = 0; i < count; ++i) {
+            const double expected = ShearOmega2(storeys, i + 1);
+            EXPECT_NEAR(expected, modes[i].omega2, 1e-8 * expected) << storeys << " " << i;
+            percent += modes[i].massPercent[X];
+            EXPECT_EQ(0.0, modes[i].massPercent[Y]);
+        }
+        if (count == storeys) {
+            EXPECT_NEAR(100.0, percent, 1e-9); // the mass at the foot is not counted
+        }
+    }
+    // Two storeys: the ratio of the storeys is the golden section g, L = m (1 + g) of the shape
+    // (1, g), modal mass m (1 + g^2).
+    const double g = (1.0 + std::sqrt(5.0)) / 2.0;
+    const T_MODE first = Modes(ShearBuilding(2, false), 1)[0];
+    EXPECT_NEAR(g, first.shape[2][X] / first.shape[1][X], 1e-12);
+    EXPECT_NEAR(std::sqrt(2.0) * (1.0 + g) / std::sqrt(1.0 + g * g), first.participation[X], 1e-12);
+    EXPECT_NEAR(50.0 * (1.0 + g) * (1.0 + g) / (1.0 + g * g), first.massPercent[X], 1e-10);
+}
+
+TEST(Modes, OfADoublySymmetricBuildingComeInPairsAlongItsAxes)
+{
+    for (std::size_t storeys : {20u, 400u}) { // dense, and by iteration
+        const std::vector<T_MODE> modes = Modes(ShearBuilding(storeys, true), 7); // cuts a pair
+        ASSERT_EQ(7u, modes.size());
+        for (std::size_t i = 0; i < 7; ++i) {
+            const double expected = ShearOmega2(storeys, i / 2 + 1);
+            EXPECT_NEAR(expected, modes[i].omega2, 1e-8 * expected) << storeys << " " << i;
+            if (i == 6) continue; // its partner was not asked for
+            EXPECT_NEAR(0.0, modes[i].massPercent[i % 2 ? X : Y], 1e-9);
+            EXPECT_GT(modes[i].massPercent[i % 2 ? Y : X], 0.1);
+        }
+    }
+}
+
+/// A slab on four corner springs of 100 at (+-4, +-4) about (10, 20); four masses of 3 at half of
+/// that distance, or one of 12 in the middle.
+T_FRAME Slab(bool oneMass)
+{
+    T_FRAME frame = Empty();
+    T_DIAPHRAGM slab;
+    const double sides[4][2] = {{1, 1}, {-1, 1}, {-1, -1}, {1, -1}};
+    for (const auto& [sx, sy] : sides) {
+        const std::size_t n = AddNode(frame, {10.0 + 4.0 * sx, 20.0 + 4.0 * sy, 5.0});
+        Join(frame, ELEMENT_KIND::Spring, n, 0, {100.0, 100.0, 50.0, 0, 0, 0});
+        slab.nodes.push_back(n);
+    }
+    for (const auto& [sx, sy] : sides) {
+        const double reach = oneMass ? 0.0 : 2.0;
+        const std::size_t n = AddNode(frame, {10.0 + reach * sx, 20.0 + reach * sy, 5.0});
+        frame.nodes[n].mass = {3.0, 3.0, 0.0};
+        slab.nodes.push_back(n);
+    }
+    frame.diaphragms.push_back(slab);
+    return frame;
+}
+
+TEST(Modes, OfARigidSlabSwayAndTurn)
+{
+    const std::vector<T_MODE> modes = Modes(Slab(false), 10);
+    ASSERT_EQ(3u, modes.size()); // all there are
+    EXPECT_NEAR(400.0 / 12.0, modes[0].omega2, 1e-9);
+    EXPECT_NEAR(400.0 / 12.0, modes[1].omega2, 1e-9);
+    EXPECT_NEAR(4.0 * 400.0 / 12.0, modes[2].omega2, 1e-9); // springs act at twice the radius
+    EXPECT_NEAR(100.0, modes[0].massPercent[X], 1e-9);
+    EXPECT_NEAR(100.0, modes[1].massPercent[Y], 1e-9);
+    // About the origin the masses have 12 (10^2 + 20^2 + 2^2 + 2^2); turning has the last part.
+    EXPECT_NEAR(100.0 * 8.0 / 508.0, modes[2].massPercent[RZ], 1e-9);
+    EXPECT_NEAR(100.0 * 400.0 / 508.0, modes[0].massPercent[RZ], 1e-9);
+    for (int d : {X, Y, RX, RY, RZ}) {
+        double percent = 0.0;
+        for (const T_MODE& mode : modes)
+            percent += mode.massPercent[static_cast<std::size_t>(d)];
+        EXPECT_NEAR(100.0, percent, 1e-9) << d;
+    }
+    EXPECT_EQ(2u, Modes(Slab(true), 10).size()); // turning has no mass
+}
+
+TEST(Modes, SumUpToTheWholeMassAndAreOrthonormal)
+{
+    const T_FRAME frame = IrregularTower(4);
+    const std::vector<T_MODE> modes = Modes(frame, 1000);
+    ASSERT_EQ(48u, modes.size()); // 16 nodes, three directions
+    for (std::size_t d = 0; d < 6; ++d) {
+        double percent = 0.0;
+        for (const T_MODE& mode : modes)
+            percent += mode.massPercent[d];
+        EXPECT_NEAR(100.0, percent, 1e-8) << d;
+    }
+    // Nodal masses and half of the masses of beams at a node: two floor beams and one or two
+    // columns, worked out from the coordinates here.
+    std::vector<double> beams(frame.nodes.size(), 0.0);
+    for (const T_ELEMENT& e : frame.elements) {
+        double length2 = 0.0;
+        for (std::size_t i = 0; i < 3; ++i)
+            length2 += std::pow(frame.nodes[e.j].xyz[i] - frame.nodes[e.i].xyz[i], 2);
+        for (std::size_t n : {e.i, e.j})
+            beams[n] += 7.85 * 5.4e-3 * std::sqrt(length2) / 2.0;
+    }
+    for (std::size_t a = 0; a < modes.size(); ++a)
+        for (std::size_t b = 0; b <= a; ++b) {
+            double product = 0.0;
+            for (std::size_t n = 0; n < frame.nodes.size(); ++n)
+                for (std::size_t i = 0; i < 3; ++i)
+                    product += modes[a].shape[n][i] * modes[b].shape[n][i] *
+                               (frame.nodes[n].mass[i] + beams[n]);
+            EXPECT_NEAR(a == b ? 1.0 : 0.0, product, 1e-9) << a << " " << b;
+        }
+    for (std::size_t i = 1; i < modes.size(); ++i)
+        EXPECT_LE(modes[i - 1].omega2, modes[i].omega2);
+}
+
+TEST(Modes, AreTheSameByIterationAndAllAtOnce)
+{
+    const T_FRAME frame = IrregularTower(35); // 420 masses
+    const std::vector<T_MODE> few = Modes(frame, 10), all = Modes(frame, 400);
+    ASSERT_EQ(10u, few.size());
+    for (std::size_t i = 0; i < few.size(); ++i) {
+        EXPECT_NEAR(all[i].omega2, few[i].omega2, 1e-8 * all[i].omega2);
+        for (std::size_t n = 0; n < frame.nodes.size(); ++n)
+            for (std::size_t d = 0; d < 6; ++d) // the sign is settled too
+                EXPECT_NEAR(all[i].shape[n][d], few[i].shape[n][d], 1e-6);
+    }
+}
+
+TEST(Modes, NeedMassThatCanMoveAndCanBeCancelled)
+{
+    T_FRAME frame = Beam(4, {Z, RY}, {});
+    frame.materials[0].density = 0.0;
+    frame.nodes[0].mass = {5.0, 5.0, 5.0}; // on the support
+    CFrameSolver solver;
+    T_SOLVER_ERROR error;
+    std::vector<T_MODE> modes(3);
+    EXPECT_EQ(0, solver.Modes(1, modes, error));
+    EXPECT_EQ(SOLVER_FAULT::Failed, error.fault); // nothing prepared
+    EXPECT_TRUE(modes.empty());
+    ASSERT_EQ(1, solver.Prepare(frame, error));
+    EXPECT_EQ(0, solver.Modes(1, modes, error));
+    EXPECT_EQ(SOLVER_FAULT::NoMass, error.fault);
+    ASSERT_EQ(1, solver.Prepare(ShearBuilding(500, true), error));
+    std::size_t calls = 0;
+    const auto stop = [&](std::size_t done, std::size_t total) {
+        EXPECT_LE(done, total);
+        return ++calls < 5;
+    };
+    EXPECT_EQ(0, solver.Modes(3, modes, error, stop));
+    EXPECT_EQ(SOLVER_FAULT::Cancelled, error.fault);
+    EXPECT_EQ(5u, calls);
+    EXPECT_EQ(1, solver.Modes(3, modes, error)) << error.reason; // as if nothing had happened
+    EXPECT_EQ(3u, modes.size());
+}
+
+} // namespace
