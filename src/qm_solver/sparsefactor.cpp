@@ -243,8 +243,8 @@ bool AllFinite(std::span<const double> values)
 
 struct CFactorSpace::T_SPACE {
     std::unique_ptr<double[]> data;
-    std::size_t size = 0;
-    const void* user = nullptr; // whose factorisation is in it
+    std::size_t size = 0, wanted = 0; // wanted: by the largest of those that share it
+    const void* user = nullptr;       // whose factorisation is in it
 };
 
 CFactorSpace::CFactorSpace() : m_space(std::make_unique<T_SPACE>()) {}
@@ -267,6 +267,10 @@ struct CSparseFactor::T_STATE {
     int Analyse(std::string& reason);
     int Factor(const T_SYMMETRIC_MATRIX& matrix, PIVOTS pivots, std::string& reason);
     int RunFactor();
+    std::size_t SpaceFor(double slack) const
+    {
+        return static_cast<std::size_t>(mumps->SpaceEstimate() * slack) + kLeastSpace;
+    }
     bool InSpace() const { return !space || space->m_space->user == this; }
     int Solve(std::span<double> rhs, std::size_t count, std::string& reason);
     void ReadInfo();
@@ -300,6 +304,7 @@ int CSparseFactor::T_STATE::Analyse(std::string& reason)
                             mumps->Global(7));
         return 0;
     }
+    if (space) space->m_space->wanted = std::max(space->m_space->wanted, SpaceFor(1.0));
     analysed = true;
     return 1;
 }
@@ -328,11 +333,12 @@ int CSparseFactor::T_STATE::RunFactor()
     if (!space) return mumps->Run(kJobFactor);
     CFactorSpace::T_SPACE& own = *space->m_space;
     const double slack = (100.0 + mumps->Control(14)) / (100.0 + kFirstSlackPct);
-    const auto need = static_cast<std::size_t>(mumps->SpaceEstimate() * slack) + kLeastSpace;
-    if (own.size < need) {
-        own = {}; // the old memory goes first
-        own.data = std::make_unique_for_overwrite<double[]>(need);
-        own.size = need;
+    own.wanted = std::max(own.wanted, SpaceFor(slack));
+    if (own.size < own.wanted) {
+        own.data.reset(); // the old memory goes first
+        own.size = 0;
+        own.data = std::make_unique_for_overwrite<double[]>(own.wanted);
+        own.size = own.wanted;
     }
     own.user = this;
     mumps->Lend(own.data.get(), own.size);

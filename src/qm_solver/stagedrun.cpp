@@ -135,7 +135,7 @@ CStagedRun::T_FAULT CStagedRun::Step(std::size_t stage, std::size_t step)
             std::sort(cases.begin(), cases.end());
             cases.erase(std::unique(cases.begin(), cases.end()), cases.end());
         } else {
-            fault = Part().Factorise({}, true);
+            fault = Part().Factorise();
             ++m_cost.factorisations;
             m_factorised = true;
         }

@@ -86,17 +86,32 @@ std::optional<T_SOLVER_ERROR> CStagePart::Prepare(std::shared_ptr<CFactorSpace> 
     return {};
 }
 
-std::optional<T_SOLVER_ERROR> CStagePart::Factorise(std::span<const T_AXIAL> axial, bool stable)
+std::optional<T_SOLVER_ERROR> CStagePart::Factorise()
+{
+    if (!m_firstOrder) m_assembly.Assemble(m_frame);
+    m_firstOrder = true;
+    return Numeric({}, !m_proven);
+}
+
+std::optional<T_SOLVER_ERROR> CStagePart::Factorise(std::span<const T_AXIAL> axial, bool search)
 {
     m_assembly.Assemble(m_frame, axial);
+    m_firstOrder = false;
+    return Numeric(axial, search);
+}
+
+std::optional<T_SOLVER_ERROR> CStagePart::Numeric(std::span<const T_AXIAL> axial, bool search)
+{
     if (m_dofs->EquationCount() == 0) return {}; // everything is held
     std::string reason;
     T_SOLVER_ERROR error;
-    if (stable) {
+    if (search) {
         if (!FactorStable(m_frame, *m_dofs, Matrix(), m_factor, error, axial)) return error;
-    } else if (!m_factor.Factor(Matrix(), reason)) {
-        return Failed(reason);
+        m_proven = m_proven || m_firstOrder;
+        return {};
     }
+    const PIVOTS pivots = m_firstOrder ? PIVOTS::AsTheyAre : PIVOTS::Watch;
+    if (!m_factor.Factor(Matrix(), reason, pivots)) return Failed(reason);
     return {};
 }
 

@@ -19,8 +19,10 @@ public:
 
     /// Checks the part and does the symbolic factorisation; errors have the model's indices.
     std::optional<T_SOLVER_ERROR> Prepare(std::shared_ptr<CFactorSpace> space);
-    /// Assembles and factorises. `stable`: with the search for mechanisms.
-    std::optional<T_SOLVER_ERROR> Factorise(std::span<const T_AXIAL> axial, bool stable);
+    /// Factorises the stiffness of the first order; looks for mechanisms the first time.
+    std::optional<T_SOLVER_ERROR> Factorise();
+    /// The same with axial forces, by element of the part. `search`: for mechanisms.
+    std::optional<T_SOLVER_ERROR> Factorise(std::span<const T_AXIAL> axial, bool search);
 
     const T_ACTIVE& Active() const { return m_active; }
     const T_FRAME& Frame() const { return m_frame; }
@@ -40,6 +42,7 @@ public:
     void AddLoads(const T_LOAD_CASE& load, double factor, T_LOAD_CASE& sum) const;
 
 private:
+    std::optional<T_SOLVER_ERROR> Numeric(std::span<const T_AXIAL> axial, bool search);
     std::optional<std::size_t> Own(std::size_t element) const;
     std::optional<T_SOLVER_ERROR> CheckPlaces(const T_LOAD_CASE& load, bool comes) const;
 
@@ -51,6 +54,8 @@ private:
     std::optional<CFrameDofs> m_dofs;
     CFrameAssembly m_assembly;
     CSparseFactor m_factor;
+    bool m_firstOrder = false; // the matrix holds the stiffness of the first order
+    bool m_proven = false;     // which is known to be regular
 };
 
 } // namespace solver

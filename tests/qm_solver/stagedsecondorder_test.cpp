@@ -381,7 +381,8 @@ TEST(StagedSecondOrder, EveryStageOfAStayedBridgeIsInBalance)
                     return x * (j[0] - i[0]) + z * (j[2] - i[2]);
                 };
                 const double n = r.force[e][0][0], w = 7.85 * kA * frame.gravity;
-                const double modulus = 1 / (1 + std::pow(w * along[0], 2) * kEA / (12 * n * n * n));
+                const double sag = std::pow(w * along[0], 2) * kEA / (12 * n * n * n);
+                const double modulus = std::max(1e-3, 1 / (1 + sag)); // one stay goes slack
                 EXPECT_NEAR(tension[e] + modulus * kEA / length * (stretch(r) - stretch(births[e])),
                             n, 1e-8)
                     << s << " element " << e;
