@@ -101,19 +101,57 @@ TEST(StagedSecondOrder, OnePieceBalancesWithAHingeAndShearDeformation)
 
 TEST(StagedSecondOrder, AColumnBeyondItsLoadBuckles)
 {
-    const double critical = kEI * std::pow(std::acos(-1.0) / (2 * kHeight), 2);
-    for (const bool above : {false, true}) {
-        CStagedSolver staged;
-        T_SOLVER_ERROR error;
-        ASSERT_TRUE(staged.Prepare(Column(8), error));
-        const int done = staged.Run(Push(8, (above ? 1.01 : 0.99) * critical, 0.0), error);
-        EXPECT_EQ(above ? 0 : 1, done);
-        if (above) {
+    // Euler's load PE of the cantilever; with shear deformation PE / (1 + PE / G As) (Engesser).
+    const double euler = kEI * std::pow(std::acos(-1.0) / (2 * kHeight), 2);
+    const double shearArea = 2 * euler / 8.1e7;
+    for (const bool shear : {false, true})
+        for (const bool above : {false, true}) {
+            T_STAGED_MODEL model = Column(8);
+            if (shear) model.frame.sections[0].Asy = shearArea;
+            CStagedSolver staged;
+            T_SOLVER_ERROR error;
+            ASSERT_TRUE(staged.Prepare(model, error));
+            const double critical = shear ? euler / 1.5 : euler;
+            const int done = staged.Run(Push(8, (above ? 1.01 : 0.99) * critical, 0.0), error);
+            EXPECT_EQ(above ? 0 : 1, done) << shear;
+            if (!above) continue;
             EXPECT_EQ(SOLVER_FAULT::Mechanism, error.fault);
             EXPECT_EQ(0, error.stage);
             EXPECT_NE(std::string::npos, error.reason.find("buckles"));
         }
+}
+
+TEST(StagedSecondOrder, AHingeInTheBeamIsAHingeAtItsSupport)
+{
+    // A beam with a load on its span and a compression: hinged by releases at ends that do not
+    // turn, and without releases at ends that do.
+    T_RESULT r[2];
+    for (const bool released : {false, true}) {
+        T_FRAME frame = Empty();
+        AddNode(frame, {0, 0, 0});
+        AddNode(frame, {5, 0, 0});
+        Join(frame, kBeam, 0, 1);
+        FixAll(frame, 0);
+        Fix(frame, 1, {1, 2, 3, 4, 5});
+        for (const std::size_t n : {0, 1})
+            frame.nodes[n].fixed[4] = released;
+        frame.elements[0].releaseI[4] = frame.elements[0].releaseJ[4] = released;
+        T_LOAD_CASE load;
+        load.nodal.push_back({1, {-800, 0, 0, 0, 0, 0}});
+        load.beam.push_back({0, BEAM_LOAD::Distributed, true, 2, {-3, -5}, {0.1, 0.8}});
+        T_STAGED_MODEL model = OneStage(frame, 1);
+        model.options.geometricStiffness = true;
+        CStagedSolver staged;
+        Build(staged, model, {load});
+        r[released] = Case(staged, 0, 0);
     }
+    for (std::size_t at = 0; at < kBeamPositions; ++at)
+        for (std::size_t k = 0; k < 6; ++k)
+            EXPECT_NEAR(r[0].force[0][at][k], r[1].force[0][at][k], 1e-9) << at << " " << k;
+    EXPECT_NEAR(0, r[1].force[0][4][4], 1e-9);
+    // Both hinges turn by the load, so that the compression adds to the moment at mid-span.
+    const double w = 0.5 * 0.7 * 5 * 8;
+    EXPECT_GT(std::fabs(r[1].force[0][2][4]), 1.3 * w * 5 / 8);
 }
 
 TEST(StagedSecondOrder, ATightStringStiffensAcrossItself)
