@@ -131,4 +131,16 @@ TEST(StagedRefusals, TheInputThatTheySpoilIsGood)
     EXPECT_GT(Case(staged, 1, 1).force[2][0][0], 0.0);
 }
 
+TEST(StagedRefusals, ALoadMayLeaveWithItsElement)
+{
+    T_STAGED_INPUT in = Good();
+    in.cases[1].beam.push_back({1, BEAM_LOAD::Distributed, true, 2, {1, 1}, {0, 1}});
+    in.model.stages.push_back({});
+    S(in, 2).deactivateElements = {1, 2};
+    S(in, 2).deactivateLoads = {{1, kFirstStep}};
+    CStagedSolver staged;
+    Build(staged, in.model, in.cases);
+    EXPECT_NEAR(0, Case(staged, 2, 1).displacement[1][2], 1e-15);
+}
+
 } // namespace
