@@ -1,6 +1,7 @@
 #include "commands.h"
 
 #include "inputfile.h"
+#include "output.h"
 #include "qm_db/casefile.h"
 #include "qm_db/filectrl.h"
 #include "qm_db/modelstore.h"
@@ -13,7 +14,6 @@
 #ifdef QM_UI
 #include "qm_ui/comparisonplot.h"
 #include "qm_ui/evaluationplot.h"
-#include "qm_ui/plotfile.h"
 #endif
 
 #include <algorithm>
@@ -21,21 +21,6 @@
 #include <vector>
 
 namespace {
-
-EXIT_CODE Complain(EXIT_CODE code, const std::string& text)
-{
-    std::fprintf(stderr, "qm-rps: %s\n", text.c_str());
-    return code;
-}
-
-/// Whether the name ends in a picture format; a message where it does not.
-EXIT_CODE CheckPlotName(const std::string& path)
-{
-    for (const char* extension : {".svg", ".png", ".pdf"}) {
-        if (path.empty() || path.ends_with(extension)) return EXIT_CODE::Done;
-    }
-    return Complain(EXIT_CODE::Usage, path + ": a picture is .svg, .png or .pdf");
-}
 
 /// Additional steps and spectra; false after a message on stderr.
 bool AddExtras(CPushOverCurveDlg& driver, const T_EVALUATE_OPTIONS& options)
@@ -79,19 +64,6 @@ EXIT_CODE EvaluateAll(CDBDoc& doc, const T_EVALUATE_OPTIONS& options,
     return Complain(EXIT_CODE::Usage, doc.Path() + ": no evaluation named \"" + only + "\"");
 }
 
-/// Writes to a file, or to standard output for "-".
-EXIT_CODE WriteOutput(const std::string& path, const std::string& text)
-{
-    if (path == "-") {
-        const bool whole = std::fwrite(text.data(), 1, text.size(), stdout) == text.size();
-        return whole && std::fflush(stdout) == 0
-                   ? EXIT_CODE::Done
-                   : Complain(EXIT_CODE::NoAccess, "standard output can't be written");
-    }
-    T_FILE_ERROR error;
-    return CFileCtrl::WriteWholeFile(path, text, error) ? EXIT_CODE::Done : ReportFileError(error);
-}
-
 /// The path itself for one evaluation; for several a number before the extension.
 std::string NumberedPath(const std::string& path, std::size_t index, std::size_t count)
 {
@@ -100,28 +72,19 @@ std::string NumberedPath(const std::string& path, std::size_t index, std::size_t
     return stem + "-" + std::to_string(index + 1) + path.substr(stem.size());
 }
 
-#ifdef QM_UI
-EXIT_CODE WritePlot(const T_PLOT& plot, const std::string& path)
-{
-    std::string error;
-    if (WritePlotFile(plot, path, error)) return EXIT_CODE::Done;
-    return Complain(EXIT_CODE::NoAccess, error);
-}
-#endif
-
 EXIT_CODE WritePlots(const std::string& path, const std::vector<T_PUSH_EVALUATION>& results)
 {
 #ifdef QM_UI
     for (std::size_t i = 0; i < results.size(); ++i) {
         const std::string file = NumberedPath(path, i, results.size());
-        if (const EXIT_CODE code = WritePlot(EvaluationPlot(results[i]), file);
+        if (const EXIT_CODE code = WritePicture(EvaluationPlot(results[i]), file);
             code != EXIT_CODE::Done)
             return code;
     }
     return EXIT_CODE::Done;
 #else
     (void)results;
-    return Complain(EXIT_CODE::Usage, path + ": this qm-rps was built without pictures");
+    return CheckPlotName(path);
 #endif
 }
 
@@ -204,9 +167,7 @@ EXIT_CODE RunCompare(const T_COMPARE_OPTIONS& o)
     if (!o.json.empty()) code = WriteOutput(o.json, ResultJson(comparison.results));
 #ifdef QM_UI
     if (code == EXIT_CODE::Done && !o.plot.empty())
-        code = WritePlot(ComparisonPlot(comparison), o.plot);
-#else
-    if (!o.plot.empty()) code = Complain(EXIT_CODE::Usage, "built without pictures");
+        code = WritePicture(ComparisonPlot(comparison), o.plot);
 #endif
     if (code != EXIT_CODE::Done) return code;
     if (o.json != "-") std::printf("%s", ComparisonTable(comparison).c_str());

@@ -8,7 +8,6 @@
 
 #ifdef QM_UI
 #include "qm_ui/hingeplot.h"
-#include "qm_ui/plotfile.h"
 #endif
 
 #include <algorithm>
@@ -23,7 +22,7 @@ EXIT_CODE StoreType(CDBDoc& doc, int key, T_PHGT_D& type, const std::string& out
         component = MirroredComponent(component);
     if (!doc.Edit().Begin("hinge type") || !doc.Edit().Put(key, type) || !doc.Edit().Commit())
         return Complain(EXIT_CODE::BadInput, doc.Path() + ": the hinge type can't be stored");
-    return WriteDoc(doc, out);
+    return SaveDocument(doc, out);
 }
 
 /// True where every side that the curve uses has a yield deformation to convert with.
@@ -137,8 +136,7 @@ EXIT_CODE RunHingePlot(const T_HINGE_OPTIONS& o)
         if (!curve) return Complain(EXIT_CODE::Usage, "choose a component, Fx to Mz");
         plot = HingeBackbonePlot(type, *component, *curve, EndName(page));
     }
-    std::string error;
-    if (!WritePlotFile(plot, o.out, error)) return Complain(EXIT_CODE::NoAccess, error);
+    if (const EXIT_CODE code = WritePicture(plot, o.out); code != EXIT_CODE::Done) return code;
     std::printf("%s written\n", o.out.c_str());
     return EXIT_CODE::Done;
 #else

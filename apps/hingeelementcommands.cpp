@@ -184,7 +184,7 @@ EXIT_CODE RunHingeAssign(const T_HINGE_OPTIONS& o)
         return Complain(EXIT_CODE::BadInput, o.file + ": " + refusal.text);
     std::printf("%zu elements have hinges of type %s\n", doc.Attr().GetElemsByPhgt(key).size(),
                 type.name.c_str());
-    return WriteDoc(doc, o.out);
+    return SaveDocument(doc, o.out);
 }
 
 EXIT_CODE RunHingeGenerated(const T_HINGE_OPTIONS& o)

@@ -2,12 +2,6 @@
 
 #include <algorithm>
 
-EXIT_CODE Complain(EXIT_CODE code, const std::string& text)
-{
-    std::fprintf(stderr, "qm-rps: %s\n", text.c_str());
-    return code;
-}
-
 EXIT_CODE NoSuchType(const std::string& file, const std::string& type)
 {
     return Complain(EXIT_CODE::Usage, file + ": no hinge type named \"" + type + "\"");
@@ -30,14 +24,6 @@ EXIT_CODE OpenType(CDBDoc& doc, const T_HINGE_OPTIONS& o, int& key, T_PHGT_D& ty
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     if (doc.Attr().FindPhgt(o.type, key) && doc.Attr().GetPhgt(key, type)) return EXIT_CODE::Done;
     return NoSuchType(doc.Path(), o.type);
-}
-
-EXIT_CODE WriteDoc(CDBDoc& doc, const std::string& path)
-{
-    T_FILE_ERROR error;
-    const int written =
-        path.ends_with(".qmdb") ? doc.SaveModelAs(path, error) : doc.ExportCase(path, error);
-    return written ? EXIT_CODE::Done : ReportFileError(error);
 }
 
 T_SKEL_CURVE* PageOf(T_HINGE_COMPONENT& component, const std::string& end, HINGE_END& page)

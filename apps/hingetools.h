@@ -3,13 +3,11 @@
 
 #include "hingecommands.h"
 #include "inputfile.h"
+#include "output.h"
 #include "qm_rps/hingefindings.h"
 
 #include <cstdio>
 #include <optional>
-
-/// One line on standard error, and the code.
-EXIT_CODE Complain(EXIT_CODE code, const std::string& text);
 
 EXIT_CODE NoSuchType(const std::string& file, const std::string& type);
 
@@ -35,9 +33,6 @@ const char* EndName(HINGE_END end);
 
 /// Opens the document and takes the type of that name with its key.
 EXIT_CODE OpenType(CDBDoc& doc, const T_HINGE_OPTIONS& o, int& key, T_PHGT_D& type);
-
-/// Writes the edited document: .qmdb a model file, else a case file.
-EXIT_CODE WriteDoc(CDBDoc& doc, const std::string& path);
 
 /// The curve of the page that the options name, or null.
 T_SKEL_CURVE* PageOf(T_HINGE_COMPONENT& component, const std::string& end, HINGE_END& page);

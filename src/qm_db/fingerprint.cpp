@@ -49,7 +49,10 @@ private:
 
     void Add(const T_NODE_D& n) { (*this)(n.xyz, n.restraint); }
     void Add(const T_MATL_D& m) { (*this)(m.E, m.nu, m.G, m.density, m.alpha); }
-    void Add(const T_SECT_D& s) { (*this)(s.shape, s.size, s.area, s.Asy, s.Asz, s.J, s.Iyy, s.Izz); }
+    void Add(const T_SECT_D& s)
+    {
+        (*this)(s.shape, s.size, s.area, s.Asy, s.Asz, s.J, s.Iyy, s.Izz);
+    }
     void Add(const T_ELEM_D& e)
     {
         (*this)(e.kind, e.nodeI, e.nodeJ, e.section, e.material, e.zAxis, e.release, e.offset,

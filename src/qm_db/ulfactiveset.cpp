@@ -297,15 +297,13 @@ void CUlfActiveSet::Activate(std::size_t row, long double multiplier)
 /// tolerance, and then it is left aside.
 ULF_STEP CUlfActiveSet::GiveUp(std::size_t row, long double multiplier)
 {
-    const long double violation = Violation(row);
-    if (violation > Tolerance(kUlfRelaxedTol)) {
+    if (Violation(row) > Tolerance(kUlfRelaxedTol)) {
         m_proof.assign(1, {row, m_orient[row]});
         for (std::size_t i = 0; i < m_active.size(); ++i)
             if (std::fabs(m_dr[i]) > kRatioTol)
                 m_proof.emplace_back(m_active[i], -m_orient[m_active[i]] * m_dr[i]);
         return ULF_STEP::Infeasible;
     }
-    m_relaxed = m_relaxed || violation > Tolerance(kMeetTol);
     m_state[row] = 2;
     for (std::size_t i = 0; i < m_u.size(); ++i) // its share goes to the rows it depends on
         m_u[i] += multiplier * m_dr[i];

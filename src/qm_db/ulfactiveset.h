@@ -13,7 +13,8 @@ enum class ULF_STEP { Done, Infeasible, Limit };
 /// Method: Goldfarb and Idnani (1983); y and the multipliers are refined in long double on the
 /// active rows, before the answer is given and where a normal is nearly dependent.
 /// Range: a row whose normal depends on the active ones and which is violated by no more than
-/// kUlfRelaxedTol is left aside (Relaxed). State: one problem per object; `rows` must outlive it.
+/// kUlfRelaxedTol is left aside; the certificate of
+/// the answer says whether it is met. State: one problem per object; `rows` must outlive it.
 class CUlfActiveSet {
 public:
     explicit CUlfActiveSet(const T_ULF_ROWS& rows);
@@ -35,7 +36,6 @@ public:
     /// sense; `cost` follows the side on which each elastic row now is.
     std::vector<long double> MultipliersOf(std::span<const double> cost, double capFactor) const;
     const std::vector<std::size_t>& Active() const { return m_active; }
-    bool Relaxed() const { return m_relaxed; }
     int Steps() const { return m_steps; }
     /// After Infeasible: rows and factors whose sum contradicts itself (Farkas): normals add up to
     /// zero, right-hand sides to less than zero.
@@ -78,5 +78,4 @@ private:
     std::vector<std::pair<std::size_t, long double>> m_proof;
     double m_capFactor = 1.0;
     int m_steps = 0, m_stepLimit = 0;
-    bool m_relaxed = false;
 };

@@ -46,7 +46,7 @@ constexpr double kUlfStationaryTol = 1e-9; // gradient of the Lagrangian
 constexpr double kUlfGapTol = 1e-9;        // difference of primal and dual objective
 constexpr double kUlfRankTol = 1e-12;      // pivots below this part of the largest are zero
 constexpr double kUlfUnmetTol = 1e-6;      // an equation of exact mode that is not met
-constexpr double kUlfFreeWeight = 1e-6;    // stands for a zero weight, see below
+constexpr double kUlfFreeWeight = 1e-3;    // stands for a zero weight, see below
 
 // A zero weight: the unknown is free. It has no part in the sum of |w x| and in the largest |w x|.
 // The square sum, which is the objective 2 and decides between equal optima of 1 and 3, counts it

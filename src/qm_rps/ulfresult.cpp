@@ -10,15 +10,6 @@ namespace {
 constexpr double kActiveTolerance = 1e-8; // of the row's scale
 constexpr double kMetTolerance = 1e-6;    // likewise
 
-double Scale(const T_ULF_RESULT& r, std::size_t i)
-{
-    const T_ULF_RESULT_CONSTRAINT& c = r.constraints[i];
-    double sum = std::fabs(c.constant.value_or(0.0));
-    for (std::size_t j = 0; j < r.factors.size(); ++j)
-        sum += std::fabs(r.influence[i][j] * r.factors[j]);
-    return std::max({sum, std::fabs(c.upper.value_or(0.0)), std::fabs(c.lower.value_or(0.0))});
-}
-
 } // namespace
 
 T_ULF_RESULT_CONSTRAINT UlfResultConstraint(const T_ULFC_D& c)
@@ -53,13 +44,22 @@ double UlfValue(const T_ULF_RESULT& r, std::size_t constraint)
     return sum + r.constraints[constraint].constant.value_or(0.0);
 }
 
+double UlfScale(const T_ULF_RESULT& r, std::size_t i)
+{
+    const T_ULF_RESULT_CONSTRAINT& c = r.constraints[i];
+    double sum = std::fabs(c.constant.value_or(0.0));
+    for (std::size_t j = 0; j < r.factors.size(); ++j)
+        sum += std::fabs(r.influence[i][j] * r.factors[j]);
+    return std::max({sum, std::fabs(c.upper.value_or(0.0)), std::fabs(c.lower.value_or(0.0))});
+}
+
 std::vector<T_ULF_RESULT_ROW> UlfResultRows(const T_ULF_RESULT& r)
 {
     std::vector<T_ULF_RESULT_ROW> rows;
     for (std::size_t i = 0; i < r.constraints.size(); ++i) {
         const T_ULF_RESULT_CONSTRAINT& c = r.constraints[i];
         T_ULF_RESULT_ROW row{c.name, c.description, UlfValue(r, i), c.upper, c.lower};
-        const double scale = Scale(r, i);
+        const double scale = UlfScale(r, i);
         const auto at = [&](const std::optional<double>& bound) {
             return bound && std::fabs(row.value - *bound) <= kActiveTolerance * scale;
         };

@@ -56,6 +56,9 @@ T_ULF_RESULT_CONSTRAINT UlfResultConstraint(const T_ULFC_D& constraint);
 /// Value of constraint i: influence times factors, and the constant. The sum runs in case order.
 double UlfValue(const T_ULF_RESULT& result, std::size_t constraint);
 
+/// What is small in the row of constraint i: its scale.
+double UlfScale(const T_ULF_RESULT& result, std::size_t constraint);
+
 /// One row per user constraint. A row's scale: the largest of its bounds and the sum of the
 /// absolute contributions of the cases.
 std::vector<T_ULF_RESULT_ROW> UlfResultRows(const T_ULF_RESULT& result);

@@ -51,14 +51,6 @@ std::vector<T_FINDING> CUnknownLoadFactorConstraintDlg::Findings() const
     return CheckUlfConstraint(m_constraint, m_key, m_doc.Data().Model());
 }
 
-int CUnknownLoadFactorConstraintDlg::CheckData()
-{
-    const std::vector<T_FINDING> found = Findings();
-    if (found.empty()) return 1;
-    ShowMessage(found.front().messageKey, found.front().text);
-    return 0;
-}
-
 int CUnknownLoadFactorConstraintDlg::OnOK()
 {
     T_ULFC_D c;

@@ -2,11 +2,10 @@
 // units.
 #pragma once
 
-#include "qm_base/mdialog.h"
 #include "qm_db/dbdoc.h"
-#include "qm_rps/hingefindings.h"
+#include "qm_rps/hingedialog.h"
 
-class CUnknownLoadFactorConstraintDlg : public zql::frx::MDialog {
+class CUnknownLoadFactorConstraintDlg : public CHingeDialog {
 public:
     /// Texts of the types, by code; of the place that an equality is compared with, likewise.
     static constexpr std::array<const char*, 4> kTypeKeys{"IDS_QM_ULFC_REACTION",
@@ -29,8 +28,7 @@ public:
     std::vector<std::string> ComponentTexts() const;
 
     /// Rules that are not kept, in the order of the check; CheckData shows the first.
-    std::vector<T_FINDING> Findings() const;
-    int CheckData() override;
+    std::vector<T_FINDING> Findings() const override;
     /// Checks, then stores the constraint as one edit that can be undone; items that name it take
     /// a changed name over in the same edit. 0: refused, nothing stored.
     int OnOK() override;

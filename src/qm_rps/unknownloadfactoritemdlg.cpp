@@ -147,14 +147,6 @@ std::vector<T_FINDING> CUnknownLoadFactorItemDlg::Findings() const
     return CheckUlfItem(Record(), m_key, m_doc.Data().Model(), cases);
 }
 
-int CUnknownLoadFactorItemDlg::CheckData()
-{
-    const std::vector<T_FINDING> found = Findings();
-    if (found.empty()) return 1;
-    ShowMessage(found.front().messageKey, found.front().text);
-    return 0;
-}
-
 int CUnknownLoadFactorItemDlg::OnOK()
 {
     T_ULFI_D item;

@@ -2,14 +2,13 @@
 // constraints, and the calculation of its factors.
 #pragma once
 
-#include "qm_base/mdialog.h"
 #include "qm_db/dbdoc.h"
-#include "qm_rps/hingefindings.h"
+#include "qm_rps/hingedialog.h"
 #include "qm_rps/ulfinfluencecache.h"
 #include "qm_rps/ulfresult.h"
 #include "qm_rps/ulfstaticresponse.h"
 
-class CUnknownLoadFactorItemDlg : public zql::frx::MDialog {
+class CUnknownLoadFactorItemDlg : public CHingeDialog {
 public:
     /// Columns of the load case grid; flags are "1" and "0".
     enum COLUMN { LoadCase, Unknown, Known, Factor, Weight };
@@ -56,8 +55,7 @@ public:
     [[nodiscard]] int SetCell(std::size_t row, COLUMN column, const std::string& text);
 
     /// Rules that are not kept, in the order of the check; CheckData shows the first.
-    std::vector<T_FINDING> Findings() const;
-    int CheckData() override;
+    std::vector<T_FINDING> Findings() const override;
     /// Checks, then stores the item as one edit that can be undone. 0: refused, nothing stored.
     int OnOK() override;
     int Key() const { return m_key; }

@@ -1,6 +1,6 @@
 #include "qm_rps/yieldstrengthcalcopteffdescdlg.h"
 
-#include "qm_rps/sectionproperties.h"
+#include "qm_db/sectionproperties.h"
 
 namespace {
 

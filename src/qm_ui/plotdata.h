@@ -26,10 +26,21 @@ enum class PLOT_MARKER { Auto, None, Circle, Square, Triangle, Cross, Plus };
 
 enum class PLOT_GUIDE { Vertical, Horizontal, Radial };
 
+/// A text in place of a number on an axis; `across` stands on the other side of the plot area (y
+/// axis only).
+struct T_PLOT_AXIS_LABEL {
+    double value = 0.0;
+    std::string text{};
+    std::string across{};
+    bool operator==(const T_PLOT_AXIS_LABEL&) const = default;
+};
+
 struct T_PLOT_AXIS {
-    std::string title{};                 // with the unit: "Spectral displacement (m)"
-    bool log = false;                    // log10 axis: values not above zero are skipped
-    std::optional<T_PLOT_RANGE> range{}; // empty or not usable: taken from the data
+    std::string title{};                     // with the unit: "Spectral displacement (m)"
+    bool log = false;                        // log10 axis: values not above zero are skipped
+    std::optional<T_PLOT_RANGE> range{};     // empty or not usable: taken from the data
+    std::vector<T_PLOT_AXIS_LABEL> labels{}; // not empty: these and no numbers
+    bool bare = false;                       // neither numbers nor grid
     bool operator==(const T_PLOT_AXIS&) const = default;
 };
 
@@ -77,6 +88,8 @@ struct T_PLOT {
     std::vector<T_PLOT_GUIDE> guides{};
     std::vector<T_PLOT_LABEL> labels{};
     bool legend = true;
+    bool equalScales = false;         // x and y in the same scale: shapes keep their angles
+    double pageHeight = 640;          // of a picture file, px at 96 dpi; its width is 960
     std::vector<std::string> notes{}; // printed in columns below the plot
     bool operator==(const T_PLOT&) const = default;
 };

@@ -23,19 +23,25 @@
 
 namespace {
 
-constexpr int kWidth = 960; // px at 96 dpi
-constexpr int kHeight = 640;
+constexpr int kWidth = 960;      // px at 96 dpi
+constexpr int kMaxHeight = 8000; // px; a higher page is cut
 constexpr int kPngScale = 2;
 constexpr int kPdfDpi = 1200;
 constexpr double kScreenDpi = 96.0;
 constexpr double kDotsPerMeter = kScreenDpi / 0.0254;
+
+int Height(const T_PLOT& plot)
+{
+    const bool usable = plot.pageHeight >= 1.0 && plot.pageHeight <= kMaxHeight;
+    return usable ? static_cast<int>(plot.pageHeight) : kMaxHeight;
+}
 
 bool Paint(QPaintDevice& device, double scale, const T_PLOT& plot)
 {
     QPainter painter;
     if (!painter.begin(&device)) return false;
     painter.scale(scale, scale);
-    CPlot::Draw(painter, QRectF(0, 0, kWidth, kHeight), plot, {});
+    CPlot::Draw(painter, QRectF(0, 0, kWidth, Height(plot)), plot, {});
     return painter.end();
 }
 
@@ -58,8 +64,8 @@ bool PaintSvg(const T_PLOT& plot, QIODevice& out)
     QSvgGenerator svg;
     svg.setOutputDevice(&buffer);
     svg.setResolution(static_cast<int>(kScreenDpi));
-    svg.setSize(QSize(kWidth, kHeight));
-    svg.setViewBox(QRect(0, 0, kWidth, kHeight));
+    svg.setSize(QSize(kWidth, Height(plot)));
+    svg.setViewBox(QRect(0, 0, kWidth, Height(plot)));
     svg.setTitle(titleMark);
     svg.setDescription(textMark);
     if (!buffer.open(QIODevice::WriteOnly) || !Paint(svg, 1.0, plot)) return false;
@@ -70,7 +76,7 @@ bool PaintSvg(const T_PLOT& plot, QIODevice& out)
 
 bool PaintPng(const T_PLOT& plot, QIODevice& out)
 {
-    QImage image(kPngScale * kWidth, kPngScale * kHeight, QImage::Format_RGB32);
+    QImage image(kPngScale * kWidth, kPngScale * Height(plot), QImage::Format_RGB32);
     if (image.isNull()) return false;
     image.setDotsPerMeterX(static_cast<int>(kPngScale * kDotsPerMeter));
     image.setDotsPerMeterY(static_cast<int>(kPngScale * kDotsPerMeter));
@@ -83,7 +89,7 @@ bool PaintPdf(const T_PLOT& plot, QIODevice& out)
     QPdfWriter pdf(&out);
     pdf.setTitle(QString::fromStdString(plot.title));
     pdf.setResolution(kPdfDpi);
-    const QSizeF size(kWidth * kPointsPerPx, kHeight * kPointsPerPx);
+    const QSizeF size(kWidth * kPointsPerPx, Height(plot) * kPointsPerPx);
     pdf.setPageSize(QPageSize(size, QPageSize::Point, QString(), QPageSize::ExactMatch));
     pdf.setPageMargins(QMarginsF(0, 0, 0, 0));
     return Paint(pdf, kPdfDpi / kScreenDpi, plot);

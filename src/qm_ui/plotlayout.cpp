@@ -48,6 +48,12 @@ std::vector<std::string> SplitLines(const std::string& text)
     return lines;
 }
 
+T_PLOT_RANGE About(T_PLOT_RANGE range, double span)
+{
+    const double middle = 0.5 * (range.lo + range.hi);
+    return {middle - 0.5 * span, middle + 0.5 * span};
+}
+
 std::string PowerText(int exponent10)
 {
     return "\u00d7" + PowerOfTenText(exponent10);
@@ -72,10 +78,11 @@ T_PLOT_LAYOUT CPlotLayout::Calc(const T_PLOT_BOX& page, const T_PLOT_VIEW& view)
     rest.y += kPowerRow;
     rest.h -= kPowerRow + kTickGap + RowHeight(kTextPx) + RowHeight(kAxisTitlePx);
     if (rest.h < kMinArea) return out;
+    const double perPx = m_plot.equalScales ? EqualScales(rest, out) : 0.0;
     AddYAxis(rest, out);
     if (rest.w < kMinArea) return out;
     out.area = rest;
-    const T_PLOT_RANGE xRange = out.x.Range();
+    const T_PLOT_RANGE xRange = perPx > 0.0 ? About(out.x.Range(), perPx * rest.w) : out.x.Range();
     out.x = CPlotScale(xRange, m_plot.x.log, rest.x, rest.Right());
     AddXAxis(out);
     AddCurves(out);
@@ -159,10 +166,57 @@ void CPlotLayout::AddNotes(T_PLOT_BOX& rest, T_PLOT_LAYOUT& out) const
     rest.h = top - kTickGap - rest.y;
 }
 
+T_PLOT_TICKS CPlotLayout::Ticks(const T_PLOT_AXIS& axis, T_PLOT_RANGE range, int count) const
+{
+    if (axis.bare) return {};
+    if (axis.labels.empty()) return MakePlotTicks(range, axis.log, count);
+    T_PLOT_TICKS ticks;
+    for (const T_PLOT_AXIS_LABEL& l : axis.labels) {
+        if (l.value >= range.lo && l.value <= range.hi) ticks.major.push_back({l.value, l.text});
+    }
+    return ticks;
+}
+
+/// Widens the y range so that both ranges fit in one scale, and returns the values per px. The
+/// width of the y axis' numbers is that of the range before; a little air makes up for it.
+double CPlotLayout::EqualScales(const T_PLOT_BOX& rest, T_PLOT_LAYOUT& out) const
+{
+    constexpr double kRoom = 1.03;
+    T_PLOT_BOX trial = rest;
+    T_PLOT_LAYOUT scratch = out;
+    AddYAxis(trial, scratch);
+    if (trial.w < kMinArea) return 0.0;
+    const T_PLOT_RANGE x = out.x.Range(), y = out.y.Range();
+    const double perPx = kRoom * std::max((x.hi - x.lo) / trial.w, (y.hi - y.lo) / rest.h);
+    out.y = CPlotScale(About(y, perPx * rest.h), false, rest.Bottom(), rest.y);
+    return perPx;
+}
+
+/// The labels on the right of the area; returns the width that they take.
+double CPlotLayout::AddAcrossLabels(const T_PLOT_BOX& rest, T_PLOT_LAYOUT& out) const
+{
+    double width = 0.0;
+    for (const T_PLOT_AXIS_LABEL& l : m_plot.y.labels)
+        width = std::max(width, m_measure(l.across, kTextPx, false));
+    if (!(width > 0.0)) return 0.0;
+    const T_PLOT_RANGE range = out.y.Range();
+    const double h = RowHeight(kTextPx);
+    for (const T_PLOT_AXIS_LABEL& l : m_plot.y.labels) {
+        if (l.across.empty() || !(l.value >= range.lo && l.value <= range.hi)) continue;
+        out.texts.push_back({l.across,
+                             {rest.Right() - width, out.y.ToPixel(l.value) - 0.5 * h, width + 1, h},
+                             kTextPx,
+                             false,
+                             PLOT_ALIGN::Left,
+                             false});
+    }
+    return width + kTickGap;
+}
+
 void CPlotLayout::AddYAxis(T_PLOT_BOX& rest, T_PLOT_LAYOUT& out) const
 {
     out.y = CPlotScale(out.y.Range(), m_plot.y.log, rest.Bottom(), rest.y);
-    out.yTicks = MakePlotTicks(out.y.Range(), m_plot.y.log, TickCount(rest.h, kYTickRoom));
+    out.yTicks = Ticks(m_plot.y, out.y.Range(), TickCount(rest.h, kYTickRoom));
     const double titleH = m_plot.y.title.empty() ? 0.0 : RowHeight(kAxisTitlePx) + 4.0;
     double labelW = 0.0;
     for (const T_PLOT_TICK& t : out.yTicks.major)
@@ -183,8 +237,8 @@ void CPlotLayout::AddYAxis(T_PLOT_BOX& rest, T_PLOT_LAYOUT& out) const
                              PLOT_ALIGN::Center,
                              true});
     const double left = titleH + labelW + kTickGap;
+    rest.w -= left + AddAcrossLabels(rest, out);
     rest.x += left;
-    rest.w -= left;
     if (out.yTicks.exponent10 != 0)
         out.texts.push_back({PowerText(out.yTicks.exponent10),
                              {rest.x, rest.y - h - 1.0, 80.0, h},
@@ -199,7 +253,7 @@ void CPlotLayout::AddXAxis(T_PLOT_LAYOUT& out) const
     const T_PLOT_BOX& area = out.area;
     double labelW = 0.0;
     for (int count = TickCount(area.w, kXTickRoom); count >= 2; --count) {
-        out.xTicks = MakePlotTicks(out.x.Range(), m_plot.x.log, count);
+        out.xTicks = Ticks(m_plot.x, out.x.Range(), count);
         labelW = 0.0;
         for (const T_PLOT_TICK& t : out.xTicks.major)
             labelW = std::max(labelW, m_measure(t.label, kTextPx, false));

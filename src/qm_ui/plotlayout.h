@@ -97,6 +97,9 @@ private:
     void AddTitles(T_PLOT_BOX& rest, T_PLOT_LAYOUT& out) const;
     void AddNotes(T_PLOT_BOX& rest, T_PLOT_LAYOUT& out) const;
     void AddYAxis(T_PLOT_BOX& rest, T_PLOT_LAYOUT& out) const;
+    double AddAcrossLabels(const T_PLOT_BOX& rest, T_PLOT_LAYOUT& out) const;
+    [[nodiscard]] double EqualScales(const T_PLOT_BOX& rest, T_PLOT_LAYOUT& out) const;
+    [[nodiscard]] T_PLOT_TICKS Ticks(const T_PLOT_AXIS& axis, T_PLOT_RANGE range, int count) const;
     void AddXAxis(T_PLOT_LAYOUT& out) const;
     void AddCurves(T_PLOT_LAYOUT& out) const;
     void AddGuides(T_PLOT_LAYOUT& out) const;

@@ -39,7 +39,7 @@ const T_CASE kByHand[] = {
     { "rows that say nothing",    1, {0, 0, 0, 0},      {0, 1},   {1, 1},   2,  0,  0, {0, 0} },
     { "repeated equality",        2, {1, 1, 2, 2},      {2, 4},   {1, 1},   3,  1,  0, {1, 1} },
     { "equality by inequalities", 0, {1, 1, -1, -1},    {2, -2},  {1, 1},   1,  0,  0, {1, 1} },
-    { "free unknown, square",     1, {1, 1},            {2},      {1, 0},   2,  0,  0, {0, 2} },
+    { "free unknown, square",     1, {1, 1},            {2},      {1, 0},   2,  0,  0, {2e-6 / 1.000001, 2 / 1.000001} }, // weight 1e-3
     { "free unknown, sum",        1, {1, 1},            {2},      {1, 0},   1,  0,  0, {0, 2} },
     { "free unknown, largest",    1, {1, 1},            {2},      {1, 0},   3,  0,  0, {0, 2} },
     { "all unknowns free",        1, {1, 1},            {2},      {0, 0},   1,  0,  0, {1, 1} },

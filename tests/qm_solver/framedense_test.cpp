@@ -117,6 +117,9 @@ private:
         frame.diaphragms.push_back({{12, 14, 17, 18}, 2});
         frame.diaphragms.push_back({{6, 9, 13}, 0});
         frame.equalDisplacements.push_back({{7, 10, 15}, {false, true, false, false, true, false}});
+        // The first node of a diaphragm tied to another one afterwards, and a support that leads.
+        frame.equalDisplacements.push_back({{16, 12}, {true, false, false, false, false, true}});
+        frame.diaphragms.push_back({{8, 2}, 2});
     }
     void AddLoads(T_SAMPLE& s)
     {
@@ -124,6 +127,7 @@ private:
             s.load.nodal.push_back({Below(18), Vector6(50)});
         s.load.nodal.push_back({18, {10, 20, 30, 0, 0, 0}});
         s.load.settlement.push_back({1, Vector6(0.01)});
+        s.load.settlement.push_back({2, {Real(-0.01, 0.01), 0.004, -0.003, 0, 0, 0.002}});
         s.load.temperature.push_back({Below(30), Real(10, 30)});
         s.load.pretension.push_back({Below(30), Real(10, 30)});
     }

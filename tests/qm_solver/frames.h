@@ -3,7 +3,6 @@
 
 #include "qm_solver/framemodel.h"
 
-#include <initializer_list>
 #include <utility>
 
 namespace sample {
@@ -34,7 +33,7 @@ inline std::size_t AddNode(T_FRAME& frame, T_VEC3 xyz)
     return frame.nodes.size() - 1;
 }
 
-inline void Fix(T_FRAME& frame, std::size_t node, std::initializer_list<int> directions)
+inline void Fix(T_FRAME& frame, std::size_t node, const std::vector<int>& directions)
 {
     for (int d : directions)
         frame.nodes[node].fixed[static_cast<std::size_t>(d)] = true;

@@ -26,7 +26,7 @@ std::vector<T_MODE> Modes(const T_FRAME& frame, std::size_t count)
 }
 
 /// A beam of length 6 along X in `parts` elements that moves along Z alone; its ends as stated.
-T_FRAME Beam(std::size_t parts, std::initializer_list<int> left, std::initializer_list<int> right)
+T_FRAME Beam(std::size_t parts, const std::vector<int>& left, const std::vector<int>& right)
 {
     T_FRAME frame = Empty();
     frame.materials[0].density = 7.85;

@@ -7,7 +7,7 @@
 namespace {
 
 using namespace sample;
-using Fixed = std::vector<std::pair<std::size_t, std::initializer_list<int>>>;
+using Fixed = std::vector<std::pair<std::size_t, std::vector<int>>>;
 
 constexpr int X = 0, Y = 1, Z = 2, RX = 3, RY = 4, RZ = 5;
 

@@ -28,7 +28,7 @@ T_FRAME Portal(bool plane = true)
     return frame;
 }
 
-void Hinge(T_FRAME& frame, std::size_t element, bool atI, std::initializer_list<std::size_t> about)
+void Hinge(T_FRAME& frame, std::size_t element, bool atI, const std::vector<std::size_t>& about)
 {
     T_ELEMENT& e = frame.elements[element];
     for (std::size_t d : about)

@@ -1,0 +1,31 @@
+// Results of linear analysis as JSON and as tables.
+#pragma once
+
+#include "analysisresults.h"
+
+#include <string>
+
+/// Writes {"displacements": {CASE: {NODE: [6]}}, "reactions": ..., "truss": {CASE: {ELEMENT: N}},
+/// "beam": {CASE: {ELEMENT: [[6] at I, 1/4, 2/4, 3/4, J]}}, "modes": [...]}; cases in the order
+/// given, ids ascending, numbers in their shortest form.
+std::string AnalysisJson(const std::vector<T_SHOWN_CASE>& shown,
+                         const std::vector<T_CASE_RESULTS>& results,
+                         const std::vector<T_MODE_RESULTS>& modes);
+
+/// Tables of one load case: displacements, reactions, truss and beam forces. What is below 1e-12 of
+/// the largest displacement or force is rounding and is shown as 0.
+std::string CaseTables(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& results,
+                       const T_UNITS& units);
+/// The largest values of one load case, and the sum of the reactions.
+std::string CaseSummary(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& results,
+                        const T_UNITS& units);
+/// Periods, participation factors and effective masses.
+std::string ModeTable(const std::vector<T_MODE_RESULTS>& modes);
+
+/// "kN", "m", "kN*m".
+std::string ForceName(const T_UNITS& units);
+std::string LengthName(const T_UNITS& units);
+std::string MomentName(const T_UNITS& units);
+
+/// The text as a JSON string, with its quotes.
+std::string JsonText(const std::string& text);

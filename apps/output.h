@@ -1,0 +1,26 @@
+// What all commands do with their results: complaints, texts, pictures, model files.
+#pragma once
+
+#include "exitcodes.h"
+#include "qm_db/dbdoc.h"
+
+#include <string>
+#include <string_view>
+
+struct T_PLOT;
+
+/// One line on stderr; gives the code back.
+EXIT_CODE Complain(EXIT_CODE code, const std::string& text);
+
+/// Done for no name or one that ends in a picture format that this program can draw; else a
+/// message and Usage.
+EXIT_CODE CheckPlotName(const std::string& path);
+
+/// Writes to a file, or to standard output for "-".
+EXIT_CODE WriteOutput(const std::string& path, std::string_view text);
+
+/// Draws the plot; nothing for an empty path.
+EXIT_CODE WritePicture(const T_PLOT& plot, const std::string& path);
+
+/// Writes the document as a model file (.qmdb) or as a case file, told by the name.
+EXIT_CODE SaveDocument(CDBDoc& doc, const std::string& path);

@@ -1,0 +1,27 @@
+// The arguments of linear analysis.
+#include "analysecommands.h"
+#include "registrations.h"
+
+#include <CLI/CLI.hpp>
+
+void AddAnalyse(CLI::App& app, EXIT_CODE& code)
+{
+    auto* sub = app.add_subcommand("analyse", "Linear analysis of load cases, and modes");
+    auto o = std::make_shared<T_ANALYSE_OPTIONS>();
+    sub->add_option("FILE", o->file, "Model file (.qmdb) or case file (.json)")->required();
+    sub->add_option("--case", o->cases, "Load case or combination to show (default: all cases)");
+    sub->add_option("--modes", o->modes, "Number of eigen modes to find")
+        ->check(CLI::Range(1, 1000000));
+    sub->add_option("--json", o->json, "Write the results as JSON; - for standard output");
+    sub->add_flag("--table", o->table, "Print the tables also when the JSON goes to a file");
+    sub->add_option("--plot", o->plot, "Draw the deformed shape: .svg, .png or .pdf");
+    auto* plotCase =
+        sub->add_option("--plot-case", o->plotCase, "Load case or combination of the picture");
+    sub->add_option("--plot-mode", o->plotMode, "Mode of the picture")->excludes(plotCase);
+    sub->add_option("-o", o->out, "Write the model with its results (.qmdb) or as a case file");
+    sub->add_flag("--no-store", o->noStore, "Don't store the results in the model file");
+    sub->footer("Results are in the file's units. Member forces are internal forces of the cut "
+                "seen from the I side.\nExample:\n  qm-rps analyse "
+                "examples/cable-stayed-bridge/case.json --case DEAD --plot shape.svg");
+    sub->callback([=, &code] { code = RunAnalyse(*o); });
+}

@@ -1,0 +1,14 @@
+// The arguments of the commands, one source file for each group. `code` gets what a command that
+// was asked for has returned.
+#pragma once
+
+#include "exitcodes.h"
+
+namespace CLI {
+class App;
+}
+
+void AddHingeCommands(CLI::App& app, EXIT_CODE& code);
+void AddCase(CLI::App& app, EXIT_CODE& code);
+void AddAnalyse(CLI::App& app, EXIT_CODE& code);
+void AddUlf(CLI::App& app, EXIT_CODE& code);
