@@ -46,6 +46,10 @@ template <>
 inline constexpr T_TABLE<T_ULFC_D> T_MODEL::*kTableOf<T_ULFC_D> = &T_MODEL::ulfConstraints;
 template <>
 inline constexpr T_TABLE<T_ULFI_D> T_MODEL::*kTableOf<T_ULFI_D> = &T_MODEL::ulfItems;
+template <>
+inline constexpr T_TABLE<T_STAG_D> T_MODEL::*kTableOf<T_STAG_D> = &T_MODEL::stages;
+template <>
+inline constexpr T_TABLE<T_ULSI_D> T_MODEL::*kTableOf<T_ULSI_D> = &T_MODEL::ulfStageItems;
 
 /// Table of a record type: nodes for T_NODE_D, and so on.
 template <class T>

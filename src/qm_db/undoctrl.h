@@ -21,7 +21,8 @@ using T_CHANGE_ANY =
                  T_CHANGE<T_SPFC_D>, T_CHANGE<T_POLC_D>, T_CHANGE<T_EVAL_D>, T_CHANGE<T_MATL_D>,
                  T_CHANGE<T_SECT_D>, T_CHANGE<T_ELEM_D>, T_CHANGE<T_PHGT_D>, T_CHANGE<T_PHGE_D>,
                  T_CHANGE<T_IEHP_D>, T_CHANGE<T_POFC_D>, T_CHANGE<T_DIAP_D>, T_CHANGE<T_EQDS_D>,
-                 T_CHANGE<T_STLD_D>, T_CHANGE<T_LCOM_D>, T_CHANGE<T_ULFC_D>, T_CHANGE<T_ULFI_D>>;
+                 T_CHANGE<T_STLD_D>, T_CHANGE<T_LCOM_D>, T_CHANGE<T_ULFC_D>, T_CHANGE<T_ULFI_D>,
+                 T_CHANGE<T_STAG_D>, T_CHANGE<T_ULSI_D>>;
 
 /// What one command of the user changed.
 struct T_UNDO_STEP {

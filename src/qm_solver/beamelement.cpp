@@ -69,12 +69,13 @@ bool BeamAxes(const T_FRAME& frame, const T_ELEMENT& element, T_AXES& axes, doub
     return true;
 }
 
-CBeamElement::CBeamElement(const T_FRAME& frame, const T_ELEMENT& element)
-    : m_offsetI(element.offsetI), m_offsetJ(element.offsetJ)
+CBeamElement::CBeamElement(const T_FRAME& frame, const T_ELEMENT& element, double tension)
+    : m_offsetI(element.offsetI), m_offsetJ(element.offsetJ), m_tension(tension)
 {
     if (!BeamAxes(frame, element, m_axes, m_shape.length)) return; // not of a checked frame
     m_hasOffset = Largest(m_offsetI) > 0.0 || Largest(m_offsetJ) > 0.0;
     MakeLocalStiffness(frame.materials[element.material], frame.sections[element.section]);
+    if (tension != 0.0) AddGeometricStiffness(m_shape, tension, m_local);
     T_VEC12 diagonal;
     for (std::size_t d = 0; d < 12; ++d)
         diagonal[d] = m_local[d][d];
@@ -102,7 +103,7 @@ void CBeamElement::Release(std::size_t at, double diagonal)
         m_loose = static_cast<int>(at);
         return;
     }
-    T_RELEASE release{at, {}};
+    T_RELEASE release{at, {}, pivot};
     for (std::size_t i = 0; i < 12; ++i)
         release.gain[i] = m_local[i][at] / pivot;
     const T_VEC12 row = m_local[at];
@@ -167,7 +168,8 @@ T_VEC12 CBeamElement::FixedEndForces(std::span<const T_SPAN_LOAD> loads, double 
     return forces;
 }
 
-/// Displacements of the nodes taken to the ends of the flexible length, local axes.
+/// Displacements of the nodes taken to the ends of the flexible length, local axes, released or
+/// not.
 T_VEC12 CBeamElement::EndDisplacements(const T_VEC12& displacement) const
 {
     T_VEC12 local;
@@ -198,7 +200,7 @@ double CBeamElement::StrainEnergy(const T_VEC12& displacement) const
     for (std::size_t i = 0; i < 12; ++i)
         for (std::size_t j = 0; j < 12; ++j)
             energy += strain[i] * m_local[i][j] * strain[j];
-    return energy;
+    return energy + m_tension * m_shape.length * (chordY * chordY + chordZ * chordZ);
 }
 
 T_VEC12 CBeamElement::EndForces(const T_VEC12& displacement, const T_VEC12& fixedEnd) const
@@ -237,6 +239,33 @@ T_VEC6 CBeamElement::InternalForces(const T_VEC12& endForces, std::span<const T_
     for (double& value : sum)
         value = -value;
     return sum;
+}
+
+/// The release that was condensed last knows the movement of its end by the nodes alone, the ones
+/// before it also by those after.
+T_VEC12 CBeamElement::MovedEnds(const T_VEC12& displacement,
+                                std::span<const T_SPAN_LOAD> loads) const
+{
+    T_VEC12 ends = EndDisplacements(displacement), forces{};
+    for (const T_SPAN_LOAD& load : loads)
+        AddFixedEndForces(m_shape, load, forces);
+    for (const T_RELEASE& release : m_releases) {
+        ends[release.at] = -forces[release.at] / release.pivot;
+        const double given = forces[release.at];
+        for (std::size_t i = 0; i < 12; ++i)
+            forces[i] -= release.gain[i] * given;
+    }
+    for (auto release = m_releases.rbegin(); release != m_releases.rend(); ++release)
+        for (std::size_t i = 0; i < 12; ++i)
+            if (i != release->at) ends[release->at] -= release->gain[i] * ends[i];
+    return ends;
+}
+
+void CBeamElement::AddDeflectionMoments(const T_VEC12& movedEnds, double s, T_VEC6& internal) const
+{
+    const auto cut = DeflectionAt(m_shape, s * m_shape.length, movedEnds);
+    internal[4] -= m_tension * (cut[1] - movedEnds[2]);
+    internal[5] += m_tension * (cut[0] - movedEnds[1]);
 }
 
 } // namespace solver

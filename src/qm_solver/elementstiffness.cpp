@@ -6,15 +6,17 @@ namespace solver {
 
 namespace {
 
-void TrussMatrix(const T_FRAME& frame, const T_ELEMENT& element, T_MATRIX12& k)
+void TrussMatrix(const T_FRAME& frame, const T_ELEMENT& element, const T_AXIAL& axial,
+                 T_MATRIX12& k)
 {
     double length = 0.0;
     const T_VEC3 e = TrussDirection(frame, element, length);
-    const double axial = TrussStiffness(frame, element, length);
+    const double across = axial.tension / length;
+    const double along = axial.modulus * TrussStiffness(frame, element, length) - across;
     k = {};
     for (std::size_t r = 0; r < 3; ++r)
         for (std::size_t c = 0; c < 3; ++c) {
-            const double value = axial * e[r] * e[c];
+            const double value = along * e[r] * e[c] + (r == c ? across : 0.0);
             k[r][c] = k[6 + r][6 + c] = value;
             k[r][6 + c] = k[6 + r][c] = -value;
         }
@@ -34,14 +36,15 @@ double TrussStiffness(const T_FRAME& frame, const T_ELEMENT& element, double len
     return frame.materials[element.material].E * frame.sections[element.section].A / length;
 }
 
-void ElementStiffness(const T_FRAME& frame, const T_ELEMENT& element, T_MATRIX12& stiffness)
+void ElementStiffness(const T_FRAME& frame, const T_ELEMENT& element, const T_AXIAL& axial,
+                      T_MATRIX12& stiffness)
 {
     switch (element.kind) {
     case ELEMENT_KIND::Beam:
-        CBeamElement(frame, element).Stiffness(stiffness);
+        CBeamElement(frame, element, axial.tension).Stiffness(stiffness);
         break;
     case ELEMENT_KIND::Truss:
-        TrussMatrix(frame, element, stiffness);
+        TrussMatrix(frame, element, axial, stiffness);
         break;
     case ELEMENT_KIND::Link:
     case ELEMENT_KIND::Spring:
@@ -54,16 +57,20 @@ void ElementStiffness(const T_FRAME& frame, const T_ELEMENT& element, T_MATRIX12
     }
 }
 
-double StrainEnergy(const T_FRAME& frame, const T_ELEMENT& element, const T_VEC12& u)
+double StrainEnergy(const T_FRAME& frame, const T_ELEMENT& element, const T_AXIAL& axial,
+                    const T_VEC12& u)
 {
     double energy = 0.0, length = 0.0;
     switch (element.kind) {
     case ELEMENT_KIND::Beam:
-        return CBeamElement(frame, element).StrainEnergy(u);
+        return CBeamElement(frame, element, axial.tension).StrainEnergy(u);
     case ELEMENT_KIND::Truss: {
         const T_VEC3 e = TrussDirection(frame, element, length);
-        const double strain = Dot(e, Minus(Part(u, 6), Part(u, 0)));
-        return TrussStiffness(frame, element, length) * strain * strain;
+        const T_VEC3 drift = Minus(Part(u, 6), Part(u, 0));
+        const double strain = Dot(e, drift);
+        const T_VEC3 across = Minus(drift, Scaled(e, strain));
+        return axial.modulus * TrussStiffness(frame, element, length) * strain * strain +
+               axial.tension / length * Dot(across, across);
     }
     case ELEMENT_KIND::Link:
         for (std::size_t d = 0; d < 6; ++d)

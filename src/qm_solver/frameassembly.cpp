@@ -158,13 +158,13 @@ void CFrameAssembly::MakePlaces(const CPattern& pattern)
     }
 }
 
-void CFrameAssembly::Assemble(const T_FRAME& frame)
+void CFrameAssembly::Assemble(const T_FRAME& frame, std::span<const T_AXIAL> axial)
 {
     std::fill(m_matrix.value.begin(), m_matrix.value.end(), 0.0);
     T_MATRIX12 stiffness;
     for (std::size_t e = 0; e < frame.elements.size(); ++e) {
         if (m_starts[e].unknowns == 0) continue;
-        ElementStiffness(frame, frame.elements[e], stiffness);
+        ElementStiffness(frame, frame.elements[e], axial.empty() ? T_AXIAL{} : axial[e], stiffness);
         if (m_starts[e].plain)
             AddPlain(e, stiffness);
         else

@@ -20,8 +20,8 @@ public:
     /// Pattern and places. Frame and map are used again by Assemble with the same topology.
     /// 1 done; 0 `reason` filled: the matrix has more entries than can be counted.
     [[nodiscard]] int Prepare(const T_FRAME& frame, const CFrameDofs& dofs, std::string& reason);
-    /// Values of the matrix from the elements' stiffness.
-    void Assemble(const T_FRAME& frame);
+    /// Values of the matrix from the elements' stiffness; axial by element, empty: first order.
+    void Assemble(const T_FRAME& frame, std::span<const T_AXIAL> axial = {});
     const T_SYMMETRIC_MATRIX& Matrix() const { return m_matrix; }
 
 private:

@@ -61,6 +61,7 @@ struct T_SOLVER_ERROR {
     /// Index of the node or element that is at fault, -1 for none.
     long node = -1, element = -1;
     long loadCase = -1; // index of the load case at fault, -1 for none
+    long stage = -1;    // index of the construction stage at fault, -1 for none
     int direction = -1; // 0 to 5, of a mechanism at a node
     /// Nodes of a part of the model that moves as a rigid body; empty otherwise.
     std::vector<std::size_t> part;

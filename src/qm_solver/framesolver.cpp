@@ -1,6 +1,7 @@
 #include "qm_solver/framesolver.h"
 
 #include "qm_base/textformat.h"
+#include "qm_solver/balance.h"
 #include "qm_solver/caseblock.h"
 #include "qm_solver/frameassembly.h"
 #include "qm_solver/frameextent.h"
@@ -9,7 +10,6 @@
 #include "qm_solver/modesolver.h"
 #include "qm_solver/sparsefactor.h"
 #include "qm_solver/stabilitycheck.h"
-#include "qm_solver/symmetricproduct.h"
 
 #include <algorithm>
 #include <cmath>
@@ -19,9 +19,6 @@ namespace solver {
 namespace {
 
 constexpr std::size_t kCaseBlock = 64; // right-hand sides solved together
-/// Forces out of balance over the largest load of the case beyond which a solution is refused:
-/// stiffness contrasts of 1e10 stay below, a motion that escaped the factorisation does not.
-constexpr double kBalance = 1e-5;
 
 T_SOLVER_ERROR Failed(std::string reason)
 {
@@ -29,18 +26,6 @@ T_SOLVER_ERROR Failed(std::string reason)
     error.fault = SOLVER_FAULT::Failed;
     error.reason = std::move(reason);
     return error;
-}
-
-/// The largest force and the largest moment over the unknowns.
-std::array<double, 2> Largest(const CFrameDofs& dofs, std::span<const double> values)
-{
-    std::array<double, 2> largest{};
-    for (std::size_t q = 0; q < values.size(); ++q) {
-        double& of = largest[dofs.Owner(q) % 6 < 3 ? 0 : 1];
-        const double value = std::fabs(values[q]);
-        of = value <= of ? of : value; // a NaN comes through
-    }
-    return largest;
 }
 
 } // namespace
@@ -56,7 +41,6 @@ struct CFrameSolver::T_STATE {
     std::optional<T_SOLVER_ERROR> Factorise();
     std::optional<T_SOLVER_ERROR> SolveBlock(std::span<const T_LOAD_CASE> cases, std::size_t first,
                                              std::vector<T_RESULT>& out);
-    bool Balanced(std::span<const double> loads, std::span<const double> x) const;
 };
 
 std::optional<T_SOLVER_ERROR> CFrameSolver::T_STATE::Factorise()
@@ -82,25 +66,14 @@ std::optional<T_SOLVER_ERROR> CFrameSolver::T_STATE::SolveBlock(std::span<const 
     const std::size_t n = dofs.EquationCount();
     if (n > 0 && !factor.Solve(x, cases.size(), reason)) return Failed(reason);
     for (std::size_t c = 0; c < cases.size(); ++c)
-        if (!Balanced(std::span(loads).subspan(c * n, n), std::span(x).subspan(c * n, n))) {
-            T_SOLVER_ERROR error = Failed("the forces do not balance: the model is nearly unstable "
-                                          "or its stiffnesses differ too much");
+        if (!InBalance(assembly.Matrix(), dofs, extent, std::span(loads).subspan(c * n, n),
+                       std::span(x).subspan(c * n, n))) {
+            T_SOLVER_ERROR error = Failed(kOutOfBalance);
             error.loadCase = static_cast<long>(first + c);
             return error;
         }
     block.Recover(x, out);
     return {};
-}
-
-bool CFrameSolver::T_STATE::Balanced(std::span<const double> loads, std::span<const double> x) const
-{
-    std::vector<double> rest(loads.size());
-    AddProduct<double>(assembly.Matrix(), x, rest);
-    for (std::size_t q = 0; q < rest.size(); ++q)
-        rest[q] -= loads[q];
-    const std::array<double, 2> load = Largest(dofs, loads), off = Largest(dofs, rest);
-    const double force = std::max(load[0], load[1] / extent);
-    return off[0] <= kBalance * force && off[1] <= kBalance * force * extent;
 }
 
 CFrameSolver::CFrameSolver() = default;

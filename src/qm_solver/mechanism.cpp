@@ -1,6 +1,5 @@
 #include "qm_solver/mechanism.h"
 
-#include "qm_solver/elementstiffness.h"
 #include "qm_solver/movement.h"
 #include "qm_solver/symmetricproduct.h"
 
@@ -74,20 +73,23 @@ int SoftestShape(const T_SYMMETRIC_MATRIX& k, CSparseFactor& factor, std::vector
 
 /// Strain energy over what the same displacements would store if each worked alone. A rigid-body
 /// motion of doubles has 1e-32 at best; solving for it costs some of that.
-bool StrainsNothing(const T_FRAME& frame, std::span<const double> full)
+bool StrainsNothing(const T_FRAME& frame, std::span<const T_AXIAL> axial,
+                    std::span<const double> full)
 {
     double energy = 0.0, apart = 0.0;
-    for (const T_ELEMENT& element : frame.elements) {
+    for (std::size_t e = 0; e < frame.elements.size(); ++e) {
+        const T_ELEMENT& element = frame.elements[e];
+        const T_AXIAL own = axial.empty() ? T_AXIAL{} : axial[e];
         T_VEC12 u{};
         T_MATRIX12 stiffness;
-        ElementStiffness(frame, element, stiffness);
+        ElementStiffness(frame, element, own, stiffness);
         for (std::size_t i = 0; i < ElementSize(element); ++i) {
             u[i] = full[ElementIndex(element, i)];
             apart += stiffness[i][i] * u[i] * u[i];
         }
-        energy += StrainEnergy(frame, element, u);
+        energy += StrainEnergy(frame, element, own, u);
     }
-    return energy <= kStrainless * apart;
+    return std::fabs(energy) <= kStrainless * std::fabs(apart);
 }
 
 int Fail(T_SOLVER_ERROR& error, std::string reason)
@@ -122,14 +124,14 @@ int FindMechanism(const T_SYMMETRIC_MATRIX& k, CSparseFactor& factor,
 }
 
 int FactorStable(const T_FRAME& frame, const CFrameDofs& dofs, const T_SYMMETRIC_MATRIX& k,
-                 CSparseFactor& factor, T_SOLVER_ERROR& error)
+                 CSparseFactor& factor, T_SOLVER_ERROR& error, std::span<const T_AXIAL> axial)
 {
     std::string reason;
     std::optional<std::vector<double>> shape;
     std::vector<double> full(dofs.FullCount());
     const auto strainless = [&](std::span<const double> v) {
         dofs.Expand(v, full);
-        return StrainsNothing(frame, full);
+        return StrainsNothing(frame, axial, full);
     };
     if (!factor.Factor(k, reason)) return Fail(error, reason);
     if (!FindMechanism(k, factor, strainless, shape, reason)) return Fail(error, reason);

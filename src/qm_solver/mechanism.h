@@ -1,6 +1,7 @@
 // Mechanisms that the factorisation of a stiffness matrix shows.
 #pragma once
 
+#include "qm_solver/elementstiffness.h"
 #include "qm_solver/framedofs.h"
 #include "qm_solver/frameresult.h"
 #include "qm_solver/sparsefactor.h"
@@ -28,9 +29,9 @@ using StrainlessFn = std::function<bool(std::span<const double> displacement)>;
 /// that nothing moves: a mechanism is one whose strain energy, element by element from their
 /// deformations, is nothing. Where pivots vanish and no mechanism is behind it the matrix is
 /// factorised again as it is. 1 done; 0 error filled: a Mechanism with the node and the direction
-/// of the largest movement, or Failed.
+/// of the largest movement, or Failed. axial: by element, as the matrix has it; empty: first order.
 [[nodiscard]] int FactorStable(const T_FRAME& frame, const CFrameDofs& dofs,
                                const T_SYMMETRIC_MATRIX& k, CSparseFactor& factor,
-                               T_SOLVER_ERROR& error);
+                               T_SOLVER_ERROR& error, std::span<const T_AXIAL> axial = {});
 
 } // namespace solver

@@ -86,6 +86,40 @@ void AddFixedEndForces(const T_BEAM_SHAPE& shape, const T_SPAN_LOAD& load, T_VEC
     }
 }
 
+std::array<double, 2> DeflectionAt(const T_BEAM_SHAPE& shape, double x, const T_VEC12& ends)
+{
+    std::array<double, 2> deflection{};
+    for (const T_PLANE& plane : kPlanes) {
+        T_VEC3 unit{};
+        unit[plane.direction] = 1.0;
+        T_VEC12 forces{}; // minus the shapes, by Betti
+        AddForceAt(shape, x, unit, forces);
+        for (const std::size_t i : {plane.v1, plane.r1, plane.v2, plane.r2})
+            deflection[plane.direction - 1] -= forces[i] * ends[i];
+    }
+    return deflection;
+}
+
+void AddGeometricStiffness(const T_BEAM_SHAPE& shape, double tension, T_MATRIX12& stiffness)
+{
+    const double L = shape.length;
+    for (const T_PLANE& plane : kPlanes) {
+        const double phi = Phi(shape, plane);
+        const std::array<std::size_t, 4> at{plane.v1, plane.r1, plane.v2, plane.r2};
+        for (const T_GAUSS& g : kGauss) {
+            const double s = g.at, chord = (6.0 * (s * s - s) - phi) / L;
+            const double shear = 0.5 * phi * (1.0 - 2.0 * s);
+            const std::array<double, 4> slope{chord,
+                                              plane.sign * (1.0 - 4.0 * s + 3.0 * s * s + shear),
+                                              -chord, plane.sign * (3.0 * s * s - 2.0 * s - shear)};
+            const double weight = tension * L * g.weight / ((1.0 + phi) * (1.0 + phi));
+            for (std::size_t i = 0; i < 4; ++i)
+                for (std::size_t j = 0; j < 4; ++j)
+                    stiffness[at[i]][at[j]] += weight * slope[i] * slope[j];
+        }
+    }
+}
+
 void AddResultantBefore(const T_SPAN_LOAD& load, double x, bool whole, T_VEC6& resultant)
 {
     const auto addForce = [&](double at, const T_VEC3& p) {

@@ -1,4 +1,5 @@
-// Loads on the flexible length of a Timoshenko beam: fixed-end forces and resultants, exact.
+// What follows from the deflected shapes of a Timoshenko beam: fixed-end forces and resultants of
+// loads on its flexible length, exact, and the geometric stiffness of a tension.
 #pragma once
 
 #include "qm_solver/vec3.h"
@@ -26,6 +27,13 @@ struct T_SPAN_LOAD {
 /// displacement of the ends (Betti); shapes: Przemieniecki, Theory of Matrix Structural Analysis
 /// (1968) chapter 5, in the form with the shear parameter.
 void AddFixedEndForces(const T_BEAM_SHAPE& shape, const T_SPAN_LOAD& load, T_VEC12& forces);
+
+/// Deflections along y and z at x from the I end by displacements of the ends (local axes).
+std::array<double, 2> DeflectionAt(const T_BEAM_SHAPE& shape, double x, const T_VEC12& ends);
+
+/// Adds tension times the integral of the products of the shapes' slopes, of both planes of
+/// bending. A pinned column of n elements buckles at about (pi / n)^4 / 720 above Euler's load.
+void AddGeometricStiffness(const T_BEAM_SHAPE& shape, double tension, T_MATRIX12& stiffness);
 
 /// Adds the resultant, about position x, of the part of the load before x. A point load or moment
 /// exactly at x counts as behind it, unless `whole`, which takes everything.

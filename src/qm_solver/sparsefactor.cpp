@@ -19,26 +19,28 @@ namespace {
 static_assert(sizeof(MUMPS_INT) == sizeof(int) && sizeof(idx_t) == sizeof(int));
 
 constexpr int kJobInit = -1, kJobEnd = -2, kJobAnalyse = 1, kJobFactor = 2, kJobSolve = 3;
-constexpr int kCommWorld = -987654;   // the sequential library's stand-in for a communicator
-constexpr int kIndefinite = 2;        // SYM: 1 would let singular matrices pass without a word
-constexpr int kGivenOrder = 1;        // ICNTL(7)
-constexpr int kFirstSlackPct = 30;    // ICNTL(14): memory beyond the estimate
-constexpr int kMaxTries = 6;          // of a factorisation, each with twice the slack and more
-constexpr std::size_t kRhsBlock = 64; // about ten times cheaper per side than single solves
-constexpr double kMegaByte = 1.0e6;   // of INFOG
+constexpr int kCommWorld = -987654;       // the sequential library's stand-in for a communicator
+constexpr int kIndefinite = 2;            // SYM: 1 would let singular matrices pass without a word
+constexpr int kGivenOrder = 1;            // ICNTL(7)
+constexpr int kFirstSlackPct = 30;        // ICNTL(14): memory beyond the estimate
+constexpr int kMaxTries = 6;              // of a factorisation, each with twice the slack and more
+constexpr std::size_t kRhsBlock = 64;     // about ten times cheaper per side than single solves
+constexpr double kMegaByte = 1.0e6;       // of INFOG
+constexpr std::size_t kLeastSpace = 1000; // entries of a lent work array beyond the estimate
 
 struct T_ERROR_WORDS {
     int code;
     const char* words;
 };
 
-constexpr std::array<T_ERROR_WORDS, 12> kErrors{{
+constexpr std::array<T_ERROR_WORDS, 13> kErrors{{
     {-5, "not enough memory to analyse the matrix"},
     {-6, "the matrix is singular in structure"},
     {-7, "not enough memory to analyse the matrix"},
     {-8, "the factorisation ran out of work space"},
     {-9, "the factorisation ran out of work space"},
     {-10, "the matrix is singular"},
+    {-11, "the factorisation ran out of work space"},
     {-13, "not enough memory to factorise the matrix"},
     {-14, "the solution ran out of work space"},
     {-16, "the number of equations is out of range"},
@@ -98,13 +100,22 @@ public:
     int& Control(int i) { return m_id.icntl[i - 1]; } // numbered as in the library's guide
     int Global(int i) const { return m_id.infog[i - 1]; }
     /// Counts that do not fit are given in millions, negative.
-    double GlobalCount(int i) const
+    double GlobalCount(int i) const { return Count(Global(i)); }
+    /// Entries of the main work array that the analysis estimates.
+    double SpaceEstimate() const { return Count(m_id.info[7]); }
+    /// Lends the library its main work array.
+    void Lend(double* space, std::size_t size)
     {
-        const double raw = Global(i);
-        return raw < 0.0 ? -raw * 1.0e6 : raw;
+        m_id.wk_user = space;
+        m_id.lwk_user =
+            size <= kIntMax ? static_cast<int>(size) : -static_cast<int>(size / kMillion);
     }
 
 private:
+    static constexpr std::size_t kMillion = 1000000;
+    static constexpr std::size_t kIntMax = std::numeric_limits<int>::max();
+    static double Count(double raw) { return raw < 0.0 ? -raw * double{kMillion} : raw; }
+
     DMUMPS_STRUC_C m_id{};
 };
 
@@ -230,12 +241,22 @@ bool AllFinite(std::span<const double> values)
 
 } // namespace
 
+struct CFactorSpace::T_SPACE {
+    std::unique_ptr<double[]> data;
+    std::size_t size = 0;
+    const void* user = nullptr; // whose factorisation is in it
+};
+
+CFactorSpace::CFactorSpace() : m_space(std::make_unique<T_SPACE>()) {}
+CFactorSpace::~CFactorSpace() = default;
+
 struct CSparseFactor::T_STATE {
     std::size_t n = 0;
     bool analysed = false, factored = false;
     std::vector<int> row, column, order; // numbered from 1
     std::unique_ptr<CMumps> mumps;       // after its arrays: it is destroyed before them
     T_FACTOR_INFO info;
+    std::shared_ptr<CFactorSpace> space;
 
     int Fail(std::string& reason) const
     {
@@ -245,6 +266,8 @@ struct CSparseFactor::T_STATE {
     void Take(const T_SYMMETRIC_MATRIX& matrix);
     int Analyse(std::string& reason);
     int Factor(const T_SYMMETRIC_MATRIX& matrix, PIVOTS pivots, std::string& reason);
+    int RunFactor();
+    bool InSpace() const { return !space || space->m_space->user == this; }
     int Solve(std::span<double> rhs, std::size_t count, std::string& reason);
     void ReadInfo();
 };
@@ -287,16 +310,33 @@ int CSparseFactor::T_STATE::Factor(const T_SYMMETRIC_MATRIX& matrix, PIVOTS pivo
     // The library reads the values and does not write them.
     mumps->Id().a = const_cast<double*>(matrix.value.data());
     mumps->Control(24) = pivots == PIVOTS::Watch ? 1 : 0;
-    int code = mumps->Run(kJobFactor);
-    for (int tries = 1; (code == -8 || code == -9) && tries < kMaxTries; ++tries) {
+    int code = RunFactor();
+    for (int tries = 1; (code == -8 || code == -9 || code == -11) && tries < kMaxTries; ++tries) {
         mumps->Control(14) = 2 * mumps->Control(14) + 50;
-        code = mumps->Run(kJobFactor);
+        code = RunFactor();
     }
     mumps->Id().a = nullptr;
     if (code < 0) return Fail(reason);
     ReadInfo();
     factored = true;
     return 1;
+}
+
+/// The estimate of the analysis holds the first slack already.
+int CSparseFactor::T_STATE::RunFactor()
+{
+    if (!space) return mumps->Run(kJobFactor);
+    CFactorSpace::T_SPACE& own = *space->m_space;
+    const double slack = (100.0 + mumps->Control(14)) / (100.0 + kFirstSlackPct);
+    const auto need = static_cast<std::size_t>(mumps->SpaceEstimate() * slack) + kLeastSpace;
+    if (own.size < need) {
+        own = {}; // the old memory goes first
+        own.data = std::make_unique_for_overwrite<double[]>(need);
+        own.size = need;
+    }
+    own.user = this;
+    mumps->Lend(own.data.get(), own.size);
+    return mumps->Run(kJobFactor);
 }
 
 void CSparseFactor::T_STATE::ReadInfo()
@@ -333,7 +373,7 @@ CSparseFactor::CSparseFactor(CSparseFactor&&) noexcept = default;
 CSparseFactor& CSparseFactor::operator=(CSparseFactor&&) noexcept = default;
 
 int CSparseFactor::Analyse(const T_SYMMETRIC_MATRIX& matrix, std::span<const int> block,
-                           std::string& reason)
+                           std::string& reason, std::shared_ptr<CFactorSpace> space)
 try {
     m_state.reset();
     const std::size_t n = matrix.Size();
@@ -345,6 +385,7 @@ try {
     auto state = std::make_unique<T_STATE>();
     state->Take(matrix);
     state->analysed = n == 0;
+    state->space = std::move(space);
     if (n > 0) {
         T_GRAPH graph = BlockGraph(matrix, block);
         const std::vector<idx_t> position = BlockOrder(graph);
@@ -379,7 +420,8 @@ try {
 
 int CSparseFactor::Solve(std::span<double> rhs, std::size_t count, std::string& reason)
 {
-    if (!m_state || !m_state->factored || rhs.size() != m_state->n * count) {
+    if (!m_state || !m_state->factored || rhs.size() != m_state->n * count ||
+        (m_state->n > 0 && !m_state->InSpace())) {
         reason = "no factorisation of the right-hand sides' size";
         return 0;
     }

@@ -31,6 +31,19 @@ enum class PIVOTS {
     AsTheyAre, // used however small they are: for a matrix known to be regular
 };
 
+/// Memory that several factors use in turn. A factorisation overwrites the one before it in the
+/// same space; only the last one can solve.
+class CFactorSpace {
+public:
+    CFactorSpace();
+    ~CFactorSpace();
+
+private:
+    friend class CSparseFactor;
+    struct T_SPACE;
+    std::unique_ptr<T_SPACE> m_space;
+};
+
 class CSparseFactor {
 public:
     CSparseFactor();
@@ -40,9 +53,10 @@ public:
 
     /// Symbolic phase for a pattern. block[i]: the block (node) that equation i belongs to, blocks
     /// counting from 0 in the order of equations; the ordering works on the graph of the blocks.
+    /// space: where the factors go; empty: memory of their own.
     /// 1 done; 0 `reason` filled.
     [[nodiscard]] int Analyse(const T_SYMMETRIC_MATRIX& matrix, std::span<const int> block,
-                              std::string& reason);
+                              std::string& reason, std::shared_ptr<CFactorSpace> space = {});
     /// Numeric phase; the pattern is that of Analyse. Watched pivots that vanish are no failure:
     /// they are listed in Info. 1 done; 0 `reason` filled.
     [[nodiscard]] int Factor(const T_SYMMETRIC_MATRIX& matrix, std::string& reason,

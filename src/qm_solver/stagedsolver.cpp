@@ -1,0 +1,141 @@
+#include "qm_solver/stagedsolver.h"
+
+#include "qm_solver/stagedrun.h"
+
+#include <algorithm>
+
+namespace solver {
+
+struct CStagedSolver::T_STATE {
+    T_STAGED_MODEL model;
+    T_STAGE_PLAN plan;
+    std::vector<std::unique_ptr<CStagePart>> parts; // those that differ
+    std::vector<std::size_t> partOf;                // by stage
+    T_STAGED_COST cost;
+    std::optional<CStagedRun> run;
+
+    explicit T_STATE(const T_STAGED_MODEL& staged) : model(staged) {}
+    std::optional<T_SOLVER_ERROR> MakeParts();
+};
+
+/// All parts share the memory of one factor.
+std::optional<T_SOLVER_ERROR> CStagedSolver::T_STATE::MakeParts()
+{
+    const auto space = std::make_shared<CFactorSpace>();
+    for (std::size_t s = 0; s < plan.active.size(); ++s) {
+        const auto at = std::find_if(parts.begin(), parts.end(), [&](const auto& part) {
+            return part->Active() == plan.active[s];
+        });
+        partOf.push_back(static_cast<std::size_t>(at - parts.begin()));
+        if (at != parts.end()) continue;
+        parts.push_back(std::make_unique<CStagePart>(model.frame, plan.active[s]));
+        ++cost.analyses;
+        if (auto fault = parts.back()->Prepare(space)) {
+            fault->stage = static_cast<long>(s);
+            return fault;
+        }
+    }
+    return {};
+}
+
+CStagedSolver::CStagedSolver() = default;
+CStagedSolver::~CStagedSolver() = default;
+CStagedSolver::CStagedSolver(CStagedSolver&&) noexcept = default;
+CStagedSolver& CStagedSolver::operator=(CStagedSolver&&) noexcept = default;
+
+int CStagedSolver::Prepare(const T_STAGED_MODEL& model, T_SOLVER_ERROR& error)
+{
+    m_state.reset();
+    auto state = std::make_unique<T_STATE>(model);
+    std::optional<T_SOLVER_ERROR> fault = MakePlan(state->model, state->plan);
+    if (!fault) fault = state->MakeParts();
+    if (fault) {
+        error = *fault;
+        return 0;
+    }
+    m_state = std::move(state);
+    return 1;
+}
+
+int CStagedSolver::Run(std::span<const T_LOAD_CASE> cases, T_SOLVER_ERROR& error,
+                       const ProgressFn& progress)
+{
+    std::optional<T_SOLVER_ERROR> fault;
+    if (m_state) m_state->run.reset();
+    if (!m_state || cases.size() != m_state->model.groups.size()) {
+        fault.emplace();
+        fault->fault = m_state ? SOLVER_FAULT::BadModel : SOLVER_FAULT::Failed;
+        fault->reason = m_state ? "not every load case has its group" : "no model is prepared";
+    } else {
+        T_STATE& s = *m_state;
+        s.run.emplace(s.model, s.plan, s.parts, s.partOf, cases, s.cost);
+        fault = s.run->Go(progress);
+        if (fault) s.run.reset();
+    }
+    if (fault) {
+        error = *fault;
+        return 0;
+    }
+    return 1;
+}
+
+std::size_t CStagedSolver::StageCount() const
+{
+    return m_state ? m_state->model.stages.size() : 0;
+}
+
+int CStagedSolver::StepCount(std::size_t stage) const
+{
+    return stage < StageCount() ? m_state->model.stages[stage].steps : 0;
+}
+
+double CStagedSolver::Age(std::size_t element, std::size_t stage) const
+{
+    constexpr double kAway = -1.0;
+    if (stage >= StageCount() || element >= m_state->plan.bornIn.size()) return kAway;
+    const auto& there = m_state->plan.active[stage].elements;
+    if (!std::binary_search(there.begin(), there.end(), element)) return kAway;
+    double age = 0.0;
+    for (auto s = static_cast<std::size_t>(m_state->plan.bornIn[element]); s <= stage; ++s)
+        age += m_state->model.stages[s].duration;
+    return age;
+}
+
+const T_STAGED_COST& CStagedSolver::Cost() const
+{
+    static const T_STAGED_COST kNothing;
+    return m_state ? m_state->cost : kNothing;
+}
+
+int CStagedSolver::Read(std::size_t stage, int step, std::span<const double> factors,
+                        T_RESULT& out) const
+{
+    out = {};
+    if (!m_state || !m_state->run || factors.size() != m_state->model.groups.size()) return 0;
+    T_MIX mix;
+    for (std::size_t c = 0; c < factors.size(); ++c)
+        if (factors[c] != 0.0) mix.emplace_back(c, factors[c]);
+    return m_state->run->Read(stage, step, mix, out);
+}
+
+int CStagedSolver::ReadCase(std::size_t stage, int step, std::size_t loadCase, T_RESULT& out) const
+{
+    out = {};
+    if (!m_state || loadCase >= m_state->model.groups.size()) return 0;
+    std::vector<double> factors(m_state->model.groups.size(), 0.0);
+    factors[loadCase] = 1.0;
+    return Read(stage, step, factors, out);
+}
+
+int CStagedSolver::ReadSum(std::size_t stage, int step, STAGE_SUM sum, T_RESULT& out) const
+{
+    out = {};
+    if (!m_state) return 0;
+    std::vector<double> factors;
+    for (const LOAD_GROUP group : m_state->model.groups)
+        factors.push_back(
+            sum == STAGE_SUM::All || static_cast<int>(sum) == static_cast<int>(group) ? 1.0 : 0.0);
+    return Read(stage, step, factors, out);
+}
+
+} // namespace solver

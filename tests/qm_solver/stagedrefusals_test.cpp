@@ -1,0 +1,134 @@
+// What the staged analysis refuses, with the stage and the place that is at fault.
+#include "staged.h"
+
+#include <functional>
+#include <limits>
+
+namespace {
+
+using namespace sample;
+
+struct T_STAGED_INPUT {
+    T_STAGED_MODEL model;
+    std::vector<T_LOAD_CASE> cases;
+};
+
+/// A cantilever of two beams with a tie that comes in the second stage; a weight and a push.
+T_STAGED_INPUT Good()
+{
+    T_STAGED_INPUT in;
+    T_FRAME& frame = in.model.frame;
+    frame = Empty();
+    for (const T_VEC3 at : {T_VEC3{0, 0, 0}, {4, 0, 0}, {8, 0, 0}, {0, 0, 6}})
+        AddNode(frame, at);
+    FixAll(frame, 0);
+    Fix(frame, 3, {0, 1, 2});
+    Join(frame, ELEMENT_KIND::Beam, 0, 1);
+    Join(frame, ELEMENT_KIND::Beam, 1, 2);
+    Join(frame, ELEMENT_KIND::Truss, 3, 2);
+    in.model.groups = {LOAD_GROUP::Dead, LOAD_GROUP::Rest};
+    in.model.stages.resize(2);
+    in.model.stages[0].activateElements = {0};
+    in.model.stages[0].activateSupports = {{0, {}}};
+    in.model.stages[0].activateLoads = {{0, 1}};
+    in.model.stages[1].activateElements = {1, 2};
+    in.model.stages[1].activateSupports = {{3, {}}};
+    in.model.stages[1].activateLoads = {{1, 2}};
+    in.model.stages[1].steps = 2;
+    in.cases.resize(2);
+    in.cases[0].nodal.push_back({1, {0, 0, -1, 0, 0, 0}});
+    in.cases[1].pretension.push_back({2, 10.0});
+    return in;
+}
+
+struct T_REFUSED_STAGES {
+    const char* label;
+    std::function<void(T_STAGED_INPUT&)> spoil;
+    SOLVER_FAULT fault;
+    long stage, element, node, loadCase;
+    const char* reason; // part of it
+};
+
+constexpr auto kBad = SOLVER_FAULT::BadModel;
+constexpr auto kFree = SOLVER_FAULT::Mechanism;
+using T_IN = T_STAGED_INPUT;
+
+T_STAGE& S(T_IN& in, std::size_t stage)
+{
+    return in.model.stages[stage];
+}
+
+// clang-format off
+const T_REFUSED_STAGES kRefused[] = {
+    // label, spoil, fault, stage, element, node, load case, reason
+    {"no stages", [](T_IN& in) { in.model.stages.clear(); }, kBad, -1, -1, -1, -1, "no construction stages"},
+    {"cables", [](T_IN& in) { in.model.cable = {1}; }, kBad, -1, -1, -1, -1, "by element"},
+    {"steps", [](T_IN& in) { S(in, 1).steps = 0; }, kBad, 1, -1, -1, -1, "no steps"},
+    {"duration", [](T_IN& in) { S(in, 1).duration = -1; }, kBad, 1, -1, -1, -1, "duration"},
+    {"nothing stands", [](T_IN& in) { S(in, 0).activateElements.clear(); }, kBad, 0, -1, -1, -1, "no element is active"},
+    {"born twice", [](T_IN& in) { S(in, 1).activateElements.push_back(0); }, kBad, 1, 0, -1, -1, "second time"},
+    {"born again", [](T_IN& in) { in.model.stages.push_back({}); S(in, 1).deactivateElements = {0};
+                                  S(in, 2).activateElements = {0}; S(in, 1).activateSupports.push_back({1, {true, true, true, true, true, true}}); },
+     kBad, 2, 0, -1, -1, "second time"},
+    {"leaves unborn", [](T_IN& in) { S(in, 0).deactivateElements = {2}; }, kBad, 0, 2, -1, -1, "before it is born"},
+    {"born and gone", [](T_IN& in) { S(in, 1).deactivateElements = {2}; }, kBad, 1, 2, -1, -1, "before it is born"},
+    {"leaves twice", [](T_IN& in) { S(in, 1).deactivateElements = {0, 0}; }, kBad, 1, 0, -1, -1, "left already"},
+    {"missing element", [](T_IN& in) { S(in, 1).activateElements = {3}; }, kBad, 1, 3, -1, -1, "missing"},
+    {"missing leaver", [](T_IN& in) { S(in, 1).deactivateElements = {9}; }, kBad, 1, 9, -1, -1, "missing"},
+    {"missing support", [](T_IN& in) { S(in, 1).activateSupports = {{4, {}}}; }, kBad, 1, -1, 4, -1, "missing node"},
+    {"support of nothing", [](T_IN& in) { S(in, 1).activateSupports = {{2, {}}}; }, kBad, 1, -1, 2, -1, "holds no direction"},
+    {"support twice", [](T_IN& in) { S(in, 1).activateSupports = {{0, {}}}; }, kBad, 1, -1, 0, -1, "there already"},
+    {"support not there", [](T_IN& in) { S(in, 1).deactivateSupports = {{1, {}}}; }, kBad, 1, -1, 1, -1, "not there"},
+    {"missing step", [](T_IN& in) { S(in, 1).activateLoads[0].step = 3; }, kBad, 1, -1, -1, 1, "step 3 does not exist"},
+    {"step zero", [](T_IN& in) { S(in, 1).activateLoads[0].step = 0; }, kBad, 1, -1, -1, 1, "step 0 does not exist"},
+    {"missing case", [](T_IN& in) { S(in, 1).activateLoads[0].loadCase = 2; }, kBad, 1, -1, -1, 2, "load case is missing"},
+    {"load twice", [](T_IN& in) { S(in, 1).activateLoads[0].loadCase = 0; }, kBad, 1, -1, -1, 0, "acts already"},
+    {"load not there", [](T_IN& in) { S(in, 0).deactivateLoads = {{1, 1}}; }, kBad, 0, -1, -1, 1, "does not act"},
+    {"groups", [](T_IN& in) { in.cases.pop_back(); }, kBad, -1, -1, -1, -1, "group"},
+    {"load unborn", [](T_IN& in) { in.cases[0].beam.push_back({1, {}, true, 2, {1, 1}, {0, 1}}); }, kBad, 0, 1, -1, 0, "not active"},
+    {"tension unborn", [](T_IN& in) { S(in, 0).activateLoads = {{1, 1}}; S(in, 1).activateLoads.clear(); }, kBad, 0, 2, -1, 1, "not active"},
+    {"node unborn", [](T_IN& in) { in.cases[0].nodal[0].node = 2; }, kBad, 0, -1, 2, 0, "no element joins"},
+    {"missing node", [](T_IN& in) { in.cases[0].nodal[0].node = 7; }, kBad, 0, -1, 7, 0, "missing node"},
+    {"missing loaded", [](T_IN& in) { in.cases[1].pretension[0].element = 7; }, kBad, 1, 7, -1, 1, "missing element"},
+    {"load not finite", [](T_IN& in) { in.cases[1].pretension[0].force = std::numeric_limits<double>::infinity(); },
+     kBad, 1, 2, -1, 1, "finite"},
+    {"settlement unheld", [](T_IN& in) { in.cases[0].settlement.push_back({3, {0, 0, 1, 0, 0, 0}}); }, kBad, 0, -1, 3, 0, "not restrained"},
+    {"left under load", [](T_IN& in) { in.cases[1].beam.push_back({0, {}, true, 2, {1, 1}, {0, 1}}); in.model.stages.push_back({});
+                                       S(in, 2).deactivateElements = {0}; S(in, 2).activateSupports = {{1, {true, true, true, true, true, true}}}; },
+     kBad, 2, 0, -1, 1, "not active"},
+    {"bad element", [](T_IN& in) { in.model.frame.elements[2].section = 5; }, kBad, 1, 2, -1, -1, "section"},
+    {"mechanism", [](T_IN& in) { in.model.stages.push_back({}); S(in, 2).deactivateSupports = {{0, {}}}; }, kFree, 2, -1, 0, -1, "free to"},
+    {"inner mechanism", [](T_IN& in) { in.model.frame.elements[1].releaseI[4] = true;
+                                       in.model.frame.elements[1].releaseI[5] = true; }, kFree, 1, -1, 2, -1, "free to"},
+};
+// clang-format on
+
+TEST(StagedRefusals, NameTheStageAndThePlace)
+{
+    for (const T_REFUSED_STAGES& row : kRefused) {
+        T_STAGED_INPUT in = Good();
+        row.spoil(in);
+        CStagedSolver staged;
+        T_SOLVER_ERROR error;
+        EXPECT_FALSE(staged.Prepare(in.model, error) && staged.Run(in.cases, error)) << row.label;
+        EXPECT_EQ(row.fault, error.fault) << row.label;
+        EXPECT_EQ(row.stage, error.stage) << row.label;
+        EXPECT_EQ(row.element, error.element) << row.label;
+        EXPECT_EQ(row.node, error.node) << row.label;
+        EXPECT_EQ(row.loadCase, error.loadCase) << row.label;
+        EXPECT_NE(std::string::npos, error.reason.find(row.reason))
+            << row.label << ": " << error.reason;
+        T_RESULT r;
+        EXPECT_FALSE(staged.ReadSum(0, 1, STAGE_SUM::All, r)) << row.label;
+    }
+}
+
+TEST(StagedRefusals, TheInputThatTheySpoilIsGood)
+{
+    const T_STAGED_INPUT in = Good();
+    CStagedSolver staged;
+    Build(staged, in.model, in.cases);
+    EXPECT_GT(Case(staged, 1, 1).force[2][0][0], 0.0);
+}
+
+} // namespace
