@@ -269,3 +269,74 @@ TEST(StagedAnalysis, CountsStepsAndKeepsNothingWhenCancelled)
     EXPECT_EQ(1, doc.RunAnalysis(options, error)) << error.text;
     EXPECT_FALSE(doc.IsPostMode());
 }
+
+// Forced to its design shape the second element follows the first one's slope: what stands is then
+// the whole cantilever under the load at 2 m, P x2 (3 L - x) / (6 E I) at the tip by reciprocity.
+TEST(StagedAnalysis, ElementsBornToDesignFollowTheSlope)
+{
+    CDBDoc doc;
+    T_MODEL_CONTENT content = Grown();
+    content.model.styp.stageControl.birth = STAGE_BIRTH::ToDesign;
+    doc.Data().Assign(content);
+    T_ANALYSIS_ERROR error;
+    ASSERT_EQ(1, doc.RunAnalysis(StagesOnly(), error)) << error.text;
+    EXPECT_NEAR(kDownG, Down(doc, 2, 1, kStageLoadSum, 2), 1e-12);
+    EXPECT_NEAR(kG * 4 * (12 - 2) / (6 * kEI), Down(doc, 2, 1, kStageLoadSum, 3), 1e-12);
+}
+
+// One element with the consistent geometric stiffness of a compression (Przemieniecki, Theory of
+// Matrix Structural Analysis, 1968, chapter 15), tip deflection and rotation by Cramer's rule.
+TEST(StagedAnalysis, GeometricStiffnessSoftensACompressedColumn)
+{
+    CDBDoc doc;
+    T_MODEL_CONTENT content = Grown();
+    content.model.styp.stageControl.geometricStiffness = true;
+    content.model.loadCases.at(1).nodal[0].load[0] = -300e3; // N
+    content.model.stages.erase(2);
+    content.model.stages.erase(5);
+    doc.Data().Assign(content);
+    T_ANALYSIS_ERROR error;
+    ASSERT_EQ(1, doc.RunAnalysis(StagesOnly(), error)) << error.text;
+    const double N = -300.0, L = 2.0;
+    const double k11 = 12 * kEI / (L * L * L) + 6 * N / (5 * L);
+    const double k12 = 6 * kEI / (L * L) + N / 10;
+    const double k22 = 4 * kEI / L + 2 * N * L / 15;
+    const double down = kG * k22 / (k11 * k22 - k12 * k12);
+    EXPECT_GT(down, 1.04 * kDownG);
+    EXPECT_NEAR(down, Down(doc, 1, 1, kStageLoadSum, 2), 1e-9 * down);
+}
+
+// A level cable of 10 m under its initial tension of 60 kN is pulled to 100 kN: the stretch by
+// Ernst's modulus, the weight being 8 t/m3 * 9.80665 m/s2 * 0.001 m2.
+TEST(StagedAnalysis, SagSoftensACableWithInitialTension)
+{
+    const char* const text = R"({
+ "format": "qm-rps case 1", "units": {"force": "kN", "length": "m"}, "plane": "XZ",
+ "nodes": [{"id": 1, "xyz": [0, 0, 0], "restraint": [1, 1, 1, 1, 1, 1]},
+           {"id": 2, "xyz": [10, 0, 0], "restraint": [0, 1, 1, 1, 1, 1]}],
+ "stage_control": {"cable_sag": true},
+ "materials": [{"name": "S", "E": 2e8, "nu": 0.25, "density": 8}],
+ "sections": [{"name": "H", "A": 0.001}],
+ "elements": [{"id": 1, "kind": "truss", "nodes": [1, 2], "material": "S", "section": "H"}],
+ "load_cases": [{"name": "T", "pretension": [{"element": 1, "force": 60}]},
+                {"name": "P", "nodal": [{"node": 2, "load": [100, 0, 0, 0, 0, 0]}]}],
+ "stages": [{"name": "S", "activate": {"elements": [1], "supports": [1, 2],
+                                       "loads": [{"case": "T"}, {"case": "P"}]}}]
+})";
+    CDBDoc doc;
+    T_MODEL_CONTENT content;
+    T_FILE_ERROR fault;
+    ASSERT_EQ(1, CCaseFile::Parse(text, "cable", "", content, fault)) << fault.text;
+    doc.Data().Assign(content);
+    T_ANALYSIS_ERROR error;
+    ASSERT_EQ(1, doc.RunAnalysis(StagesOnly(), error)) << error.text;
+    const double weight = 8 * 9.80665 * 0.001 * 10, EA = 2e5, N = 100.0;
+    const double stretch = (N - 60) * 10 / EA * (1 + weight * weight * EA / (12 * N * N * N));
+    T_DOF6 v{};
+    double axial = 0.0;
+    doc.Post().SelectStage(1, kStageLastStep, kStageLoadSum);
+    ASSERT_EQ(1, doc.Post().GetDspcNew(2, v)) << doc.Post().Error();
+    EXPECT_NEAR(stretch, v[0], 1e-9 * stretch);
+    ASSERT_EQ(1, doc.Post().GetStrtcNew(1, axial));
+    EXPECT_NEAR(N, axial, 1e-7);
+}
