@@ -340,3 +340,23 @@ TEST(StagedAnalysis, SagSoftensACableWithInitialTension)
     ASSERT_EQ(1, doc.Post().GetStrtcNew(1, axial));
     EXPECT_NEAR(N, axial, 1e-7);
 }
+
+// The tip's element and load go as the stay comes: what the load leaves behind is held by the stay,
+// in parallel with the cantilever.
+TEST(StagedAnalysis, WhatGoesLeavesItsTraceInWhatCameWithIt)
+{
+    CDBDoc doc;
+    T_MODEL_CONTENT content = Grown();
+    content.model.stages.at(5).deactivate = {{2}, {}, {{2, kStageFirstStep}}};
+    doc.Data().Assign(content);
+    T_ANALYSIS_ERROR error;
+    ASSERT_EQ(1, doc.RunAnalysis(StagesOnly(), error)) << error.text;
+    const double cantilever = 3 * kEI / 8, stay = 2e8 * 0.001 / 3; // stiffness at 2 m
+    const double left = kDownE * stay / (stay + cantilever);
+    EXPECT_NEAR(left, Down(doc, 5, 1, 2, 2), 1e-12);
+    EXPECT_NEAR(kDownG + left, Down(doc, 5, 1, kStageLoadSum, 2), 1e-12);
+    EXPECT_EQ(0.0, Down(doc, 5, 1, 2, 3)); // gone
+    T_DOF6 v{};
+    ASSERT_EQ(1, doc.Post().GetStrbcNew(2, 0, v));
+    EXPECT_EQ(T_DOF6{}, v);
+}
