@@ -2,6 +2,8 @@
 // in the store every quantity is in SI.
 #pragma once
 
+#include "qm_db/stagerecords.h"
+
 #include <array>
 #include <optional>
 #include <string>
@@ -58,6 +60,7 @@ struct T_STLD_D {
     std::vector<T_SETTLEMENT> settlement;
     std::vector<T_TEMPERATURE_LOAD> temperature;
     std::vector<T_PTNS_D> pretension;
+    int group = kLoadGroupRest; // of the results of construction stages
     bool operator==(const T_STLD_D&) const = default;
 };
 
@@ -97,6 +100,8 @@ struct T_ULFC_D {
     int otherId = 0;               // node or element that a compared equality names
     std::optional<double> upper{}; // inequality: at most
     std::optional<double> lower{}; // inequality: at least
+    int stage = 0;                 // key of the construction stage whose result it reads; 0: none
+    int step = kStageLastStep;     // of that stage
     bool operator==(const T_ULFC_D&) const = default;
 };
 

@@ -3,6 +3,7 @@
 
 #include "qm_db/hingerecords.h"
 #include "qm_db/loadrecords.h"
+#include "qm_db/stagerecords.h"
 #include "qm_db/units.h"
 
 #include <array>
@@ -36,6 +37,7 @@ struct T_STYP_D {
     bool wallStrengthDegradation = false; // wall types offer the strength degradation curve
     bool gsd = false;                     // My and Mz offer the section-based curve
     std::optional<MODEL_PLANE> plane{};   // absent: a space model
+    T_STCT_D stageControl{};
     bool operator==(const T_STYP_D&) const = default;
 };
 
@@ -224,5 +226,7 @@ struct T_MODEL {
     T_TABLE<T_LCOM_D> combinations;       // likewise
     T_TABLE<T_ULFC_D> ulfConstraints;     // likewise
     T_TABLE<T_ULFI_D> ulfItems;           // likewise
+    T_TABLE<T_STAG_D> stages;             // likewise
+    T_TABLE<T_ULSI_D> ulfStageItems;      // likewise
     bool operator==(const T_MODEL&) const = default;
 };

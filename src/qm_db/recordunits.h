@@ -69,6 +69,14 @@ void ForEachQuantity(T_ULFI_D&, F&&)
 {
 }
 template <class F>
+void ForEachQuantity(T_STAG_D&, F&&)
+{
+}
+template <class F>
+void ForEachQuantity(T_ULSI_D&, F&&)
+{
+}
+template <class F>
 void ForEachQuantity(T_POFC_D&, F&&)
 {
 }

@@ -21,7 +21,8 @@ using T_CHANGE_ANY =
                  T_CHANGE<T_SPFC_D>, T_CHANGE<T_POLC_D>, T_CHANGE<T_EVAL_D>, T_CHANGE<T_MATL_D>,
                  T_CHANGE<T_SECT_D>, T_CHANGE<T_ELEM_D>, T_CHANGE<T_PHGT_D>, T_CHANGE<T_PHGE_D>,
                  T_CHANGE<T_IEHP_D>, T_CHANGE<T_POFC_D>, T_CHANGE<T_DIAP_D>, T_CHANGE<T_EQDS_D>,
-                 T_CHANGE<T_STLD_D>, T_CHANGE<T_LCOM_D>, T_CHANGE<T_ULFC_D>, T_CHANGE<T_ULFI_D>>;
+                 T_CHANGE<T_STLD_D>, T_CHANGE<T_LCOM_D>, T_CHANGE<T_ULFC_D>, T_CHANGE<T_ULFI_D>,
+                 T_CHANGE<T_STAG_D>, T_CHANGE<T_ULSI_D>>;
 
 /// What one command of the user changed.
 struct T_UNDO_STEP {
@@ -40,6 +41,12 @@ public:
     /// Takes back the latest step, or applies it again. 1 done; 0 there is none.
     [[nodiscard]] int Undo();
     [[nodiscard]] int Redo();
+
+    /// One undoable command of the document, by its editor: begins, ends and keeps, or takes back.
+    /// 1 done; 0 another step is open, or none is.
+    [[nodiscard]] int StartEditDB(std::string title);
+    [[nodiscard]] int CloseEditDB();
+    [[nodiscard]] int CancelEditDB();
 
     /// For CEditData: keeps a committed step (at most 200) and forgets what was undone.
     void Push(T_UNDO_STEP step);
