@@ -16,10 +16,8 @@ constexpr const char* kRule =
 constexpr const char* kHeads =
     "        NO                    Stage/Step              FACTOR   PRETENSION\n";
 constexpr const char* kBanner[] = {
-    "      ###   #   #      ####   ####    ####",
-    "     #   #  ## ##      #   #  #   #  #    ",
-    "     #   #  # # #      ####   ####    ### ",
-    "     #  ##  #   #      #  #   #          #",
+    "      ###   #   #      ####   ####    ####", "     #   #  ## ##      #   #  #   #  #    ",
+    "     #   #  # # #      ####   ####    ### ", "     #  ##  #   #      #  #   #          #",
     "      ## #  #   #      #   #  #      #### ",
 };
 constexpr int kPlaceWidth = 30;

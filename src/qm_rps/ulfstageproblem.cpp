@@ -58,8 +58,9 @@ bool NumbersAreFinite(const I& k)
 bool RowsDiffer(const I& k)
 {
     std::set<std::tuple<int, int, int>> seen;
-    return EveryRow(
-        k, [&](const auto& r) { return seen.insert({r.stage, r.step, r.loadCase}).second; });
+    return EveryRow(k, [&](const auto& r) {
+        return seen.insert({r.stage, r.step, r.loadCase}).second;
+    });
 }
 bool HasPretension(const I& k, int loadCase)
 {
@@ -174,8 +175,8 @@ std::vector<T_FINDING> CheckUlfStageItem(const T_ULSI_D& item, int ownKey, const
     std::vector<T_FINDING> out;
     WalkRules(std::span<const T_RULE<I>>(kRules), {item, model, ownKey}, {}, out);
     for (T_FINDING& f : out)
-        f.text = MMSGFunction::Format(f.messageKey,
-                                      {item.name, MMSGFunction::GetValue(f.ruleText)});
+        f.text =
+            MMSGFunction::Format(f.messageKey, {item.name, MMSGFunction::GetValue(f.ruleText)});
     for (const std::string& name : item.constraints)
         AddConstraintFindings(name, model, out);
     return out;

@@ -15,8 +15,7 @@ struct T_ULF_STAGE_FORMED {
 
 /// Records of the rows and constraints; a constraint that names a stage and step is read there.
 /// Known rows with a factor of 0 are left out: the optimizer would take them for unknown ones.
-T_ULF_STAGE_FORMED FormUlfStageProblem(const T_ULSI_D& item,
-                                       std::span<const T_ULFC_D> constraints);
+T_ULF_STAGE_FORMED FormUlfStageProblem(const T_ULSI_D& item, std::span<const T_ULFC_D> constraints);
 
 /// Load cases whose pretension an unknown row scales: its own one where the row reads its own
 /// result, else all that act at its stage and step. None of a row without the pretension flag.
