@@ -62,15 +62,13 @@ std::string ElementText(const T_ELEM_D& e)
     return FormatText("%s %d", kElemKindNames[static_cast<std::size_t>(e.kind)], e.id);
 }
 
-solver::T_NODE NodeOf(const T_NODE_D& record, const std::optional<MODEL_PLANE>& plane)
+solver::T_NODE NodeOf(const T_NODE_D& record, const solver::T_DIRS6& outOfPlane)
 {
     solver::T_NODE node;
     node.xyz = record.xyz;
     node.mass = record.mass;
-    for (std::size_t d = 0; d < node.fixed.size(); ++d) {
-        const bool out = plane && kOutOfPlane[static_cast<std::size_t>(*plane)][d];
-        node.fixed[d] = out || record.restraint[d] != 0;
-    }
+    for (std::size_t d = 0; d < node.fixed.size(); ++d)
+        node.fixed[d] = outOfPlane[d] || record.restraint[d] != 0;
     return node;
 }
 
@@ -135,6 +133,12 @@ solver::T_PRETENSION LoadOf(const T_PTNS_D& l)
 
 } // namespace
 
+solver::T_DIRS6 CAnalysisModel::OutOfPlane() const
+{
+    const auto& plane = m_model.styp.plane;
+    return plane ? kOutOfPlane[static_cast<std::size_t>(*plane)] : solver::T_DIRS6{};
+}
+
 int CAnalysisModel::FailElement(const T_ELEM_D& e, const std::string& reason,
                                 T_ANALYSIS_ERROR& error) const
 {
@@ -184,7 +188,7 @@ int CAnalysisModel::BuildFrame(T_ANALYSIS_ERROR& error)
     m_materials = KeysOf(m_model.materials);
     m_sections = KeysOf(m_model.sections);
     for (const auto& entry : m_model.nodes)
-        m_frame.nodes.push_back(NodeOf(entry.second, m_model.styp.plane));
+        m_frame.nodes.push_back(NodeOf(entry.second, OutOfPlane()));
     for (const auto& entry : m_model.materials)
         m_frame.materials.push_back(MaterialOf(entry.second));
     for (const auto& entry : m_model.sections)

@@ -20,6 +20,11 @@ public:
     /// or material. What the engine checks itself is left to it.
     [[nodiscard]] int BuildFrame(T_ANALYSIS_ERROR& error);
     const solver::T_FRAME& Frame() const { return m_frame; }
+    /// Ids by the engine's indices, ascending.
+    const std::vector<int>& NodeIds() const { return m_nodes; }
+    const std::vector<int>& ElementIds() const { return m_elements; }
+    /// Directions that a plane model holds at every node; none of a space model.
+    solver::T_DIRS6 OutOfPlane() const;
 
     /// Translates a load case. 1 done; 0 error filled: a load is on something that is not there.
     [[nodiscard]] int BuildCase(int key, solver::T_LOAD_CASE& out, T_ANALYSIS_ERROR& error) const;

@@ -12,6 +12,7 @@ struct T_ANALYSIS_OPTIONS {
     int modes = 0;          // number of eigen modes to find; 0: none
     /// Done and total parts of the whole run; returns false to cancel.
     std::function<bool(std::size_t done, std::size_t total)> progress;
+    bool stages = true; // construction stages, where the model has any
 };
 
 enum class ANALYSIS_FAULT {
@@ -19,7 +20,7 @@ enum class ANALYSIS_FAULT {
     BadModel,     // something is missing or wrong: element, node or load case named
     Mechanism,    // the model can move: node and direction, or the part, named
     NoMass,       // modes of a model without mass
-    NotConverged, // the modes
+    NotConverged, // the modes, or the axial forces of a construction stage
     Cancelled,
     Failed, // the factorisation failed for another reason
 };
@@ -28,6 +29,7 @@ struct T_ANALYSIS_ERROR {
     ANALYSIS_FAULT fault = ANALYSIS_FAULT::None;
     int node = 0, element = 0; // ids, 0: none
     int loadCase = 0;          // key, 0: none
+    int stage = 0;             // key of the construction stage, 0: none
     int direction = -1;        // of a mechanism, 0 to 5: X, Y, Z, RX, RY, RZ
     std::vector<int> part;     // nodes of a part that moves as a rigid body
     std::string text;          // one line: place and reason

@@ -3,6 +3,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_db/analysismodel.h"
 #include "qm_db/fingerprint.h"
+#include "qm_db/stagedanalysis.h"
 
 #include <algorithm>
 #include <span>
@@ -58,6 +59,20 @@ int SolveBatch(T_RUN& run, std::size_t first, std::uint64_t structure,
     return 1;
 }
 
+/// The static load cases, in one factorisation with the modes.
+int SolveStatic(T_RUN& run, std::vector<std::shared_ptr<IStaticResult>>& out,
+                T_ANALYSIS_ERROR& error)
+{
+    solver::T_SOLVER_ERROR fault;
+    if (!run.frame.BuildFrame(error)) return 0;
+    if (!run.engine.Prepare(run.frame.Frame(), fault)) return run.Fail(fault, {}, error);
+    const std::uint64_t structure = FingerprintOfStructure(run.model);
+    for (std::size_t first = 0; first < run.cases.size(); first += kBatch) {
+        if (!SolveBatch(run, first, structure, out, error)) return 0;
+    }
+    return 1;
+}
+
 int FindModes(T_RUN& run, std::vector<T_EIGV_D>& out, T_ANALYSIS_ERROR& error)
 {
     std::vector<solver::T_MODE> modes;
@@ -96,21 +111,22 @@ int CAnalysisRun::Run(const T_ANALYSIS_OPTIONS& options, T_ANALYSIS_ERROR& error
         for (const auto& entry : model.loadCases)
             run.cases.push_back(entry.first);
     }
-    run.total = run.cases.size() + static_cast<std::size_t>(std::max(options.modes, 0));
+    const bool hasStages = options.stages && !model.stages.empty();
+    CStagedAnalysis staged(model);
+    const std::size_t before =
+        run.cases.size() + static_cast<std::size_t>(std::max(options.modes, 0));
+    run.total = before + (hasStages ? staged.StepCount() : 0);
     error = {};
 
-    solver::T_SOLVER_ERROR fault;
-    if (!run.frame.BuildFrame(error)) return 0;
-    if (!run.engine.Prepare(run.frame.Frame(), fault)) return run.Fail(fault, {}, error);
-
-    const std::uint64_t structure = FingerprintOfStructure(model);
+    // Stages alone need not make a structure that stands as a whole.
     std::vector<std::shared_ptr<IStaticResult>> results;
-    for (std::size_t first = 0; first < run.cases.size(); first += kBatch) {
-        if (!SolveBatch(run, first, structure, results, error)) return 0;
-    }
+    if ((before > 0 || !hasStages) && !SolveStatic(run, results, error)) return 0;
     std::vector<T_EIGV_D> modes;
     if (options.modes > 0 && !FindModes(run, modes, error)) return 0;
+    std::shared_ptr<IStagedResult> stagedResult;
+    if (hasStages && !staged.Run(Part(options, before, run.total), stagedResult, error)) return 0;
 
+    if (hasStages) m_data.SetStagedResult(std::move(stagedResult));
     for (std::size_t i = 0; i < results.size(); ++i)
         m_data.SetStaticResult(run.cases[i], std::move(results[i]));
     return options.modes > 0 ? KeepModes(std::move(modes)) : 1;

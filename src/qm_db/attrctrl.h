@@ -11,6 +11,15 @@
 /// Ids of the elements with a hinge of that type, ascending, each once.
 std::vector<int> ElementsWithHingeType(const T_MODEL& model, int hingeType);
 
+/// A step of a construction stage with its names.
+struct T_STAG_STEP_INFO {
+    int stage = 0; // key
+    int step = kStageFirstStep;
+    std::string stageName, stepName;
+    /// "S1/Last Step"
+    std::string Text() const { return stageName + '/' + stepName; }
+};
+
 class CAttrCtrl {
 public:
     explicit CAttrCtrl(const CDataCtrl& data) : m_data(data) {}
@@ -37,6 +46,23 @@ public:
     [[nodiscard]] int GetLcom(int key, T_LCOM_D& out) const;
     [[nodiscard]] int GetUlfc(int key, T_ULFC_D& out) const;
     [[nodiscard]] int GetUlfi(int key, T_ULFI_D& out) const;
+    /// Construction stage, and unknown load factor item of construction stages.
+    [[nodiscard]] int GetStag(int key, T_STAG_D& out) const;
+    [[nodiscard]] int GetUlsi(int key, T_ULSI_D& out) const;
+    /// Control of the analysis in construction stages; every model has one.
+    [[nodiscard]] int GetStct(T_STCT_D& out) const;
+    /// Names of a step: "First Step", "User Step: 2", "Last Step" (step -1, and of a stage with
+    /// several steps the number of its last one). 0: no such stage, or it has no such step.
+    [[nodiscard]] int GetStagStepInfo(int stage, int step, T_STAG_STEP_INFO& out) const;
+    /// The same by a running number over the steps of all stages in their order, from 1. A stage
+    /// with one step counts once, as its first one; else the final step is given as -1.
+    [[nodiscard]] int GetStagStepInfo(int number, T_STAG_STEP_INFO& out) const;
+    /// Key of a stage load result by its name: the texts of IDS_DB_SGLD_SUM, IDS_DB_SGLD_DL and
+    /// IDS_DB_SGLD_ER give the sums (kStageLoadSum, ...), other names the load case. The texts of
+    /// the sums go before load cases of the same name.
+    [[nodiscard]] int GetSgldKey(std::string_view name, int& key) const;
+    /// Initial tension of an element in a load case; the sum where it has several.
+    [[nodiscard]] int GetPtns(int loadCase, int element, T_PTNS_D& out) const;
     /// The same by name.
     [[nodiscard]] int GetLcom_(std::string_view name, T_LCOM_D& out) const;
     [[nodiscard]] int GetUlfc_(std::string_view name, T_ULFC_D& out) const;
@@ -64,6 +90,8 @@ public:
     std::vector<int> GetLcomKeys() const { return GetKeys<T_LCOM_D>(); }
     std::vector<int> GetUlfcKeys() const { return GetKeys<T_ULFC_D>(); }
     std::vector<int> GetUlfiKeys() const { return GetKeys<T_ULFI_D>(); }
+    std::vector<int> GetStagKeys() const { return GetKeys<T_STAG_D>(); }
+    std::vector<int> GetUlsiKeys() const { return GetKeys<T_ULSI_D>(); }
 
     /// Section and material of an element. 0: no such element, or it lacks one of them; neither
     /// output is changed.
@@ -83,6 +111,8 @@ public:
     [[nodiscard]] int FindLcom(std::string_view name, int& key) const;
     [[nodiscard]] int FindUlfc(std::string_view name, int& key) const;
     [[nodiscard]] int FindUlfi(std::string_view name, int& key) const;
+    [[nodiscard]] int FindStag(std::string_view name, int& key) const;
+    [[nodiscard]] int FindUlsi(std::string_view name, int& key) const;
 
     /// A hinge type of one active FEMA component out of an inelastic hinge, and its I-end's curve
     /// back; component 0 to 5. See ConvertIehpToPhgtFema.

@@ -3,7 +3,7 @@
 
 #include "qm_db/hingefields.h"
 #include "qm_db/jsonreader.h"
-#include "qm_db/loadfields.h"
+#include "qm_db/stagefields.h"
 
 #include <cmath>
 #include <type_traits>
@@ -159,12 +159,36 @@ public:
     void NodeList(const char* key, std::vector<int>& ids)
     {
         Need(key, ids);
-        if (!m_names) return;
-        std::set<int> seen;
-        m_in.CheckEach(
-            key, ids, [&](int id) { return m_names->HasNode(id); }, "there is no such node");
-        m_in.CheckEach(
-            key, ids, [&](int id) { return seen.insert(id).second; }, "the node appears twice");
+        CheckIds(
+            key, ids, [&](int id) { return m_names->HasNode(id); }, "there is no such node",
+            "the node appears twice");
+    }
+    void OptNodes(const char* key, std::vector<int>& ids)
+    {
+        ids.clear();
+        if (Has(key)) NodeList(key, ids);
+    }
+    void OptElements(const char* key, std::vector<int>& ids)
+    {
+        ids.clear();
+        if (!Has(key)) return;
+        Need(key, ids);
+        CheckIds(
+            key, ids, [&](int id) { return m_names->HasElement(id); }, "there is no such element",
+            "the element appears twice");
+    }
+    /// "first", "last" or a number from 1.
+    void StageStep(const char* key, int& step, int missing)
+    {
+        step = missing;
+        if (!Has(key)) return;
+        CJsonReader member = m_in.Member(key);
+        if (member.IsText()) {
+            step = member.Choice(kStageStepNames, "step") == 0 ? kStageFirstStep : kStageLastStep;
+            return;
+        }
+        member.Read(step);
+        if (step < kStageFirstStep) member.Fail("steps count from 1");
     }
     /// A fault of a case file unless `ok`; a member that is left out is not judged.
     void Check(const char* key, bool ok, const char* reason)
@@ -270,6 +294,16 @@ private:
         CCaseGet get(in, m_units, {}, m_names);
         CaseFields(get, r, context...);
         get.Finish();
+    }
+    template <class F>
+    void CheckIds(const char* key, const std::vector<int>& ids, F exists, const char* missing,
+                  const char* twice)
+    {
+        if (!m_names || !m_in.Has(key)) return;
+        std::set<int> seen;
+        m_in.CheckEach(key, ids, exists, missing);
+        m_in.CheckEach(
+            key, ids, [&](int id) { return seen.insert(id).second; }, twice);
     }
     static void FailRef(CJsonReader& in, CASE_REF kind)
     {

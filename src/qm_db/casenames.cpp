@@ -22,6 +22,8 @@ const std::string* CCaseNames::NameOf(CASE_REF kind, int key) const
         return NameIn(m_model.loadCases, key);
     case CASE_REF::Combination:
         return NameIn(m_model.combinations, key);
+    case CASE_REF::Stage:
+        return NameIn(m_model.stages, key);
     }
     return nullptr;
 }

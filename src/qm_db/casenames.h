@@ -8,9 +8,9 @@
 #include <optional>
 #include <string>
 
-enum class CASE_REF { Material, Section, LoadCase, Combination };
-inline constexpr std::array<const char*, 4> kCaseRefNames{"material", "section", "load case",
-                                                          "combination"};
+enum class CASE_REF { Material, Section, LoadCase, Combination, Stage };
+inline constexpr std::array<const char*, 5> kCaseRefNames{"material", "section", "load case",
+                                                          "combination", "stage"};
 
 class CCaseNames {
 public:
@@ -33,5 +33,5 @@ private:
     T_KEYS& Table(CASE_REF kind) { return m_keys[static_cast<std::size_t>(kind)]; }
 
     const T_MODEL& m_model;
-    std::array<T_KEYS, 4> m_keys;
+    std::array<T_KEYS, kCaseRefNames.size()> m_keys;
 };

@@ -3,7 +3,7 @@
 
 #include "qm_db/hingefields.h"
 #include "qm_db/jsonwriter.h"
-#include "qm_db/loadfields.h"
+#include "qm_db/stagefields.h"
 
 #include <algorithm>
 #include <bit>
@@ -96,6 +96,20 @@ public:
     void Node(const char* key, int id) { Need(key, id); }
     void Element(const char* key, int id) { Need(key, id); }
     void NodeList(const char* key, const std::vector<int>& ids) { Need(key, ids); }
+    void OptNodes(const char* key, const std::vector<int>& ids)
+    {
+        if (!ids.empty()) Need(key, ids);
+    }
+    void OptElements(const char* key, const std::vector<int>& ids) { OptNodes(key, ids); }
+    void StageStep(const char* key, int step, int missing)
+    {
+        if (step == missing) return;
+        if (step > kStageFirstStep) return Need(key, step);
+        Begin(key);
+        if (step != kStageFirstStep && step != kStageLastStep)
+            return m_out.Fail("there is no step " + std::to_string(step));
+        m_out.Value(kStageStepNames[step == kStageFirstStep ? 0 : 1]);
+    }
     template <class... A>
     void Check(const A&...) const
     {
@@ -199,7 +213,8 @@ private:
                std::is_same_v<R, T_SIDES<double>> || std::is_same_v<R, T_NODAL_LOAD> ||
                std::is_same_v<R, T_BEAM_LOAD> || std::is_same_v<R, T_SETTLEMENT> ||
                std::is_same_v<R, T_TEMPERATURE_LOAD> || std::is_same_v<R, T_PTNS_D> ||
-               std::is_same_v<R, T_LCOM_ITEM> || std::is_same_v<R, T_ULFI_UNKNOWN>;
+               std::is_same_v<R, T_LCOM_ITEM> || std::is_same_v<R, T_ULFI_UNKNOWN> ||
+               std::is_same_v<R, T_STAG_LOAD> || std::is_same_v<R, T_ULSI_ROW>;
     }
     static bool Same(double a, double b) // -0.0 is not 0.0
     {

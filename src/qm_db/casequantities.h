@@ -77,6 +77,10 @@ public:
     {
     }
     template <class... A>
+    void StageStep(const A&...) const
+    {
+    }
+    template <class... A>
     void Check(const A&...) const
     {
     }

@@ -7,6 +7,7 @@ void ReadModelOptions(CJsonReader& root, T_STYP_D& styp)
 {
     CCaseGet codes(root, styp.units);
     codes.Part("design_codes", styp.designCodes);
+    codes.Part("stage_control", styp.stageControl);
     if (!root.Has("hinge_options")) return;
     CJsonReader member = root.Member("hinge_options");
     CCaseGet options(member, styp.units);
@@ -74,6 +75,9 @@ void ReadStructTables(CJsonReader& root, T_MODEL& model)
     AddNamesAhead(root, "combinations", CASE_REF::Combination, names);
     ReadTable(root, "combinations", units, &names, model.combinations, kNoReferences);
     CheckCycles(root, model);
+    ReadTable(root, "stages", units, &names, model.stages, kNoReferences);
+    AddNames(model.stages, CASE_REF::Stage, names);
     ReadTable(root, "ulf_constraints", units, &names, model.ulfConstraints, kNoReferences);
     ReadTable(root, "ulf_items", units, &names, model.ulfItems, kNoReferences);
+    ReadTable(root, "ulf_stage_items", units, &names, model.ulfStageItems, kNoReferences);
 }

@@ -22,6 +22,8 @@ void WriteStructTables(CJsonWriter& out, const T_MODEL& model)
     const T_STYP_D& styp = model.styp;
     WriteObject(out, "design_codes", styp.designCodes != T_DESIGN_CODES{},
                 [&](CCasePut& put) { CaseFields(put, styp.designCodes); });
+    WriteObject(out, "stage_control", styp.stageControl != T_STCT_D{},
+                [&](CCasePut& put) { CaseFields(put, styp.stageControl); });
     WriteObject(out, "hinge_options",
                 styp.alternativeHysteresis || styp.wallStrengthDegradation || styp.gsd,
                 [&](CCasePut& put) { HingeOptionFields(put, styp); });
@@ -32,6 +34,8 @@ void WriteStructTables(CJsonWriter& out, const T_MODEL& model)
     WriteTable(out, &names, "equal_displacements", model.equalDisplacements);
     WriteTable(out, &names, "load_cases", model.loadCases);
     WriteTable(out, &names, "combinations", model.combinations);
+    WriteTable(out, &names, "stages", model.stages);
     WriteTable(out, &names, "ulf_constraints", model.ulfConstraints);
     WriteTable(out, &names, "ulf_items", model.ulfItems);
+    WriteTable(out, &names, "ulf_stage_items", model.ulfStageItems);
 }

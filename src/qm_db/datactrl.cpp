@@ -9,6 +9,7 @@
 void CDataCtrl::Assign(T_MODEL_CONTENT content)
 {
     m_content = std::move(content);
+    m_staged.reset();
     m_modified = false;
     ++m_revision;
 }
@@ -27,6 +28,12 @@ void CDataCtrl::SetStaticResult(int loadCase, std::shared_ptr<IStaticResult> res
     else
         m_content.staticResults.erase(loadCase);
     m_modified = true;
+    ++m_revision;
+}
+
+void CDataCtrl::SetStagedResult(std::shared_ptr<IStagedResult> result)
+{
+    m_staged = std::move(result);
     ++m_revision;
 }
 

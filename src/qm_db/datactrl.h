@@ -2,6 +2,7 @@
 #pragma once
 
 #include "qm_db/modelstore.h"
+#include "qm_db/stagedresult.h"
 
 /// Where the model keeps the table of a record type.
 template <class T>
@@ -79,12 +80,18 @@ public:
     /// The same for a static load case; null removes them.
     void SetStaticResult(int loadCase, std::shared_ptr<IStaticResult> result);
 
+    /// Results of the construction stages; null where there are none. They stay in memory: a model
+    /// file does not keep them.
+    const std::shared_ptr<IStagedResult>& StagedResult() const { return m_staged; }
+    void SetStagedResult(std::shared_ptr<IStagedResult> result);
+
     /// Adds a general combination under the next key, as an edit: within the open step, else as a
     /// step of its own that can be undone. Factors have no units. Non-zero added; 0 refused: the
     /// name is empty or taken, or an item refers to nothing.
     [[nodiscard]] int AddLcom(const T_LCOM_D& combination);
     /// For CEditData only, which makes itself known.
     void SetEditor(CEditData* editor) { m_editor = editor; }
+    CEditData* Editor() const { return m_editor; }
 
     bool IsModified() const { return m_modified; }
     void SetModified(bool modified) { m_modified = modified; }
@@ -100,6 +107,7 @@ public:
 
 private:
     T_MODEL_CONTENT m_content;
+    std::shared_ptr<IStagedResult> m_staged;
     bool m_modified = false;
     long m_revision = 0;
     CEditData* m_editor = nullptr;

@@ -2,6 +2,8 @@
 
 #include "qm_db/casefile.h"
 
+#include <algorithm>
+#include <filesystem>
 #include <utility>
 
 namespace {
@@ -73,4 +75,36 @@ int CDBDoc::SaveModelAs(const std::string& path, T_FILE_ERROR& error)
 int CDBDoc::ExportCase(const std::string& path, T_FILE_ERROR& error) const
 {
     return CCaseFile::Write(path, m_data.Content(), error);
+}
+
+int CDBDoc::SaveAs(const std::string& path, T_FILE_ERROR& error)
+{
+    if (std::filesystem::path(path).extension() != ".json") return SaveModelAs(path, error);
+    if (!ExportCase(path, error)) return 0;
+    m_path = path;
+    m_data.SetModified(false);
+    return 1;
+}
+
+int CDBDoc::RunAnalysis(const T_ANALYSIS_OPTIONS& options, T_ANALYSIS_ERROR& error)
+{
+    if (m_running.exchange(true)) {
+        error = {};
+        error.fault = ANALYSIS_FAULT::Failed;
+        error.text = "an analysis of this model is running already";
+        return 0;
+    }
+    struct T_END {
+        std::atomic<bool>& running;
+        ~T_END() { running = false; }
+    } const end{m_running};
+    return CAnalysisRun(m_data, m_edit).Run(options, error);
+}
+
+bool CDBDoc::IsPostMode()
+{
+    if (!m_data.Model().stages.empty()) return m_post.CheckStagedResult() != 0;
+    const std::vector<int> cases = m_attr.GetStldKeys();
+    return std::any_of(cases.begin(), cases.end(),
+                       [&](int key) { return m_post.CheckStaticResult(key) != 0; });
 }

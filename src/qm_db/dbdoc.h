@@ -11,6 +11,8 @@
 #include "qm_db/postctrl.h"
 #include "qm_db/unitctrl.h"
 
+#include <atomic>
+
 class CDBDoc {
 public:
     CDBDoc();
@@ -45,11 +47,18 @@ public:
     [[nodiscard]] int SaveModelAs(const std::string& path, T_FILE_ERROR& error);
     [[nodiscard]] int ExportCase(const std::string& path, T_FILE_ERROR& error) const;
 
-    /// Linear analysis of static load cases, and eigen modes: see CAnalysisRun::Run.
-    [[nodiscard]] int RunAnalysis(const T_ANALYSIS_OPTIONS& options, T_ANALYSIS_ERROR& error)
-    {
-        return CAnalysisRun(m_data, m_edit).Run(options, error);
-    }
+    /// Saves as a model file, or as a case file where the path ends with ".json"; the document then
+    /// belongs to that path. 1 done; 0 error filled, the file on disk as it was.
+    [[nodiscard]] int SaveAs(const std::string& path, T_FILE_ERROR& error);
+
+    /// Analysis of static load cases and construction stages, and eigen modes: see
+    /// CAnalysisRun::Run. Returns when it is done; 0 also while another run is under way.
+    [[nodiscard]] int RunAnalysis(const T_ANALYSIS_OPTIONS& options, T_ANALYSIS_ERROR& error);
+    /// Whether a run is under way, in its progress or in another thread.
+    bool IsExcuted() const { return m_running; }
+    /// Whether there are results of the model as it is: of its construction stages where it has
+    /// any, else of a static load case.
+    bool IsPostMode();
 
     /// Path of the model or case file; empty for a new document.
     const std::string& Path() const { return m_path; }
@@ -69,4 +78,5 @@ private:
     CDynModuleMgr m_modules;
     CModelStore m_store;
     std::string m_path;
+    std::atomic<bool> m_running = false;
 };

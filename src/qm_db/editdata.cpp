@@ -1,5 +1,7 @@
 #include "qm_db/editdata.h"
 
+#include <algorithm>
+#include <cmath>
 #include <ranges>
 #include <set>
 #include <utility>
@@ -42,6 +44,29 @@ int CEditData::ErasePhgt(int key, std::vector<int>& users)
 {
     users = ElementsWithHingeType(m_data.Model(), key);
     return users.empty() ? Erase<T_PHGT_D>(key) : 0;
+}
+
+int CEditData::AddPtns(int loadCase, const T_PTNS_D& pretension)
+{
+    const T_MODEL& model = m_data.Model();
+    const auto record = model.loadCases.find(loadCase);
+    const auto element = model.elements.find(pretension.element);
+    if (!m_open || record == model.loadCases.end() || element == model.elements.end()) return 0;
+    const ELEM_KIND kind = element->second.kind;
+    const T_PTNS_D load{pretension.element, ToSi(pretension.force, m_data.Units(), kDimForce)};
+    if ((kind != ELEM_KIND::Beam && kind != ELEM_KIND::Truss) || !std::isfinite(load.force))
+        return 0;
+    T_STLD_D after = record->second;
+    auto& all = after.pretension;
+    const auto ofElement = [&](const T_PTNS_D& p) { return p.element == load.element; };
+    const auto first = std::find_if(all.begin(), all.end(), ofElement);
+    if (first == all.end()) {
+        all.push_back(load);
+    } else {
+        *first = load;
+        all.erase(std::remove_if(first + 1, all.end(), ofElement), all.end());
+    }
+    return Change<T_STLD_D>(loadCase, std::make_shared<const T_STLD_D>(std::move(after)));
 }
 
 bool CEditData::ContainsItself(int key, const T_LCOM_D& record) const

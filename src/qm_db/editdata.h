@@ -56,6 +56,10 @@ public:
     /// Deletes a hinge type. 1 done; 0 no step is open, there is no such type, or hinges use it:
     /// `users` then has the ids of their elements, ascending.
     [[nodiscard]] int ErasePhgt(int key, std::vector<int>& users);
+    /// Replaces the initial tension of an element in a load case by this one, in current units, or
+    /// adds it. 1 done; 0 no step is open, there is no such load case, the element is neither a
+    /// beam nor a truss, or the force is not finite.
+    [[nodiscard]] int AddPtns(int loadCase, const T_PTNS_D& pretension);
     /// Title, current units and gravity (in the units that the record itself names). Changing
     /// the units changes no stored quantity.
     [[nodiscard]] int PutStyp(T_STYP_D styp);

@@ -1,6 +1,7 @@
 #include "qm_db/fingerprint.h"
 
 #include "qm_db/checksum.h"
+#include "qm_db/stagedresult.h"
 
 #include <bit>
 #include <type_traits>
@@ -67,6 +68,10 @@ private:
     void Add(const T_TEMPERATURE_LOAD& l) { (*this)(l.element, l.change); }
     void Add(const T_PTNS_D& l) { (*this)(l.element, l.force); }
 
+    void Add(const T_STAG_LOAD& l) { (*this)(l.loadCase, l.step); }
+    void Add(const T_STAG_PART& p) { (*this)(p.elements, p.supports, p.loads); }
+    void Add(const T_STAG_D& s) { (*this)(s.activate, s.deactivate, s.steps); }
+
     CChecksum m_sum;
 };
 
@@ -84,5 +89,19 @@ std::uint64_t FingerprintOfCase(std::uint64_t structure, const T_STLD_D& c)
 {
     CSum sum;
     sum(structure, c.selfWeight, c.nodal, c.beam, c.settlement, c.temperature, c.pretension);
+    return sum.Value();
+}
+
+std::uint64_t FingerprintOfStages(const T_MODEL& model)
+{
+    const T_STCT_D& control = model.styp.stageControl;
+    const std::uint64_t structure = FingerprintOfStructure(model);
+    CSum sum;
+    sum(structure, model.stages, control.birth, control.geometricStiffness, control.cableSag);
+    for (const int key : StageLoadCases(model)) {
+        const auto it = model.loadCases.find(key);
+        if (it != model.loadCases.end())
+            sum(key, it->second.group, FingerprintOfCase(structure, it->second));
+    }
     return sum.Value();
 }

@@ -59,6 +59,15 @@ void CaseFields(V& v, T_FIELD_REF<V, T_PTNS_D> r)
     v.Need("force", r.force, kDimForce);
 }
 
+/// V::Ref<int>: int& or const int&.
+template <class V>
+void LoadGroupField(V& v, T_FIELD_REF<V, int> group)
+{
+    v.Opt("load_group", group, kLoadGroupRest);
+    v.Check("load_group", group >= kLoadGroupDead && group <= kLoadGroupRest,
+            "a load group is 0, 1 or 2");
+}
+
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_STLD_D> r)
 {
@@ -68,6 +77,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_STLD_D> r)
     v.List("settlement", r.settlement);
     v.List("temperature", r.temperature);
     v.List("pretension", r.pretension);
+    LoadGroupField(v, r.group);
 }
 
 // ---- combinations -------------------------------------------------------------------------------
@@ -135,6 +145,9 @@ void CaseFields(V& v, T_FIELD_REF<V, T_ULFC_D> r)
     if constexpr (V::kWrites) {
         if (r.inequality && !r.upper && !r.lower) return v.Fail("the constraint has no bound");
     }
+    v.OptRef("stage", r.stage, CASE_REF::Stage);
+    v.StageStep("step", r.step, kStageLastStep);
+    v.Check("step", r.stage != 0, "a step needs a stage");
     const T_DIM dim = UlfcDim(r.type, r.component);
     if (r.inequality) {
         v.OptIf("upper", r.upper, dim);

@@ -46,6 +46,13 @@ constexpr const char* kVersion3[] = {
     "elements INTEGER NOT NULL, fingerprint INTEGER NOT NULL, "
     "negative_zeros INTEGER NOT NULL) STRICT"};
 
+// Tables that came with version 4.
+constexpr const char* kVersion4[] = {
+    "CREATE TABLE stages(key INTEGER PRIMARY KEY, name TEXT NOT NULL, body TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+    "CREATE TABLE ulf_stage_items(key INTEGER PRIMARY KEY, name TEXT NOT NULL, "
+    "body TEXT NOT NULL, negative_zeros INTEGER NOT NULL) STRICT"};
+
 // Scalars are typed columns, quantities in SI. Bit i of negative_zeros says that the i-th column
 // of the row is -0.0: a REAL column stores a whole number as an integer, which has no such value.
 // Every list of numbers (node ids, coordinates, mode shapes, spectrum tables) is a row of "arrays":
@@ -55,7 +62,8 @@ constexpr const char* kTables[] = {
     "CREATE TABLE model(key INTEGER PRIMARY KEY, title TEXT NOT NULL, force_unit TEXT NOT NULL, "
     "length_unit TEXT NOT NULL, gravity REAL, negative_zeros INTEGER NOT NULL, "
     "concrete_code TEXT, steel_code TEXT, alternative_hysteresis INTEGER NOT NULL, "
-    "wall_strength_degradation INTEGER NOT NULL, gsd INTEGER NOT NULL, plane INTEGER) STRICT",
+    "wall_strength_degradation INTEGER NOT NULL, gsd INTEGER NOT NULL, plane INTEGER, body TEXT) "
+    "STRICT",
 
     "CREATE TABLE storeys(key INTEGER PRIMARY KEY, name TEXT NOT NULL, height REAL NOT NULL, "
     "negative_zeros INTEGER NOT NULL) STRICT",
@@ -128,10 +136,19 @@ void MigrateFrom2(const CSqliteDb& db)
         db.Exec(sql);
 }
 
+/// Version 3 had no construction stages. The body of the model is their control.
+void MigrateFrom3(const CSqliteDb& db)
+{
+    db.Exec("ALTER TABLE model ADD COLUMN body TEXT");
+    for (const char* const sql : kVersion4)
+        db.Exec(sql);
+}
+
 std::vector<std::string> AllTables()
 {
     std::vector<std::string> all(std::begin(kTables), std::end(kTables));
     all.insert(all.end(), std::begin(kVersion3), std::end(kVersion3));
+    all.insert(all.end(), std::begin(kVersion4), std::end(kVersion4));
     return all;
 }
 
@@ -139,8 +156,9 @@ std::vector<std::string> AllTables()
 
 const T_SCHEMA& CurrentSchema()
 {
-    static constexpr T_MIGRATION kMigrations[] = {{1, MigrateFrom1}, {2, MigrateFrom2}};
-    static constexpr T_SCHEMA kSchema{3, kMigrations};
+    static constexpr T_MIGRATION kMigrations[] = {
+        {1, MigrateFrom1}, {2, MigrateFrom2}, {3, MigrateFrom3}};
+    static constexpr T_SCHEMA kSchema{4, kMigrations};
     return kSchema;
 }
 

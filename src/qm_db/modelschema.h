@@ -24,7 +24,7 @@ struct T_SCHEMA {
 
 /// Tables with a checksum of their own, in the order of writing. "sqlite_schema" (the text of the
 /// schema itself) is summed too; result_blocks is summed without the data, which have their own.
-inline constexpr std::array<const char*, 21> kModelTables{"model",
+inline constexpr std::array<const char*, 23> kModelTables{"model",
                                                           "storeys",
                                                           "modes",
                                                           "spectra",
@@ -44,7 +44,9 @@ inline constexpr std::array<const char*, 21> kModelTables{"model",
                                                           "combinations",
                                                           "ulf_constraints",
                                                           "ulf_items",
-                                                          "static_results"};
+                                                          "static_results",
+                                                          "stages",
+                                                          "ulf_stage_items"};
 inline constexpr const char* kBlockTable = "result_blocks";
 inline constexpr const char* kSumTable = "checksums";
 

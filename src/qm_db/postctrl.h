@@ -1,6 +1,7 @@
 // Reading results: eigen modes and pushover steps, in the document's current units.
 #pragma once
 
+#include "qm_db/stagedreader.h"
 #include "qm_db/staticreader.h"
 
 #include <map>
@@ -36,7 +37,10 @@ private:
 
 class CPostCtrl {
 public:
-    explicit CPostCtrl(CDataCtrl& data) : m_data(data), m_poverInfo(data), m_static(data) {}
+    explicit CPostCtrl(CDataCtrl& data)
+        : m_data(data), m_poverInfo(data), m_static(data), m_staged(data)
+    {
+    }
 
     CPoverInfo* GetPoverInfo() { return &m_poverInfo; }
 
@@ -85,6 +89,21 @@ public:
     /// 1 the static load case has results of the model as it is; 0 Error says why not.
     [[nodiscard]] int CheckStaticResult(int loadCase);
 
+    /// Makes the state at the end of a step of a construction stage the current stage result.
+    /// stage: its key; step: its number, or kStageLastStep; load: a key of CAttrCtrl::GetSgldKey.
+    /// O(1): judged and computed with the first value that is asked for.
+    void SelectStage(int stage, int step, int load);
+    /// The selected stage result in current units, signs and positions as those of the static
+    /// results; what does not stand at that stage has zeros. 1 done; 0 output as it was and Error
+    /// says why: the stages have no results (those of a run are not kept in the model file), or
+    /// older ones than the model; no such stage, step, load case, node or element of that kind.
+    [[nodiscard]] int GetDspcNew(int node, T_DOF6& out);
+    [[nodiscard]] int GetReccNew(int node, T_DOF6& out);
+    [[nodiscard]] int GetStrtcNew(int element, double& axial);
+    [[nodiscard]] int GetStrbcNew(int element, int position, T_DOF6& out);
+    /// 1 the construction stages have results of the model as it is; 0 Error says why not.
+    [[nodiscard]] int CheckStagedResult();
+
     std::string Error() const { return m_error; }
 
     /// Storey drift ratios of a step, largest over the storeys: kind 1 by the storey's vertical
@@ -100,7 +119,15 @@ public:
     bool HasStoreyGaps(int loadCase) const;
 
 private:
-    int ReadForces(int element, ELEM_KIND kind, const char* otherKind, T_ELEM_FORCES& out);
+    template <class R>
+    int ReadForces(R& reader, int element, ELEM_KIND kind, T_ELEM_FORCES& out);
+    template <class R>
+    int ReadNode(R& reader, int (R::*read)(int, T_DOF6&), int node, T_DOF6& out, T_DIM linear,
+                 T_DIM angular);
+    template <class R>
+    int ReadTruss(R& reader, int element, double& axial);
+    template <class R>
+    int ReadBeam(R& reader, int element, int position, T_DOF6& out);
     void ToCurrentUnits(T_DOF6& values, T_DIM linear, T_DIM angular) const;
     int ReadSeries(int node, const std::vector<double>*& out);
     int ReadCurve();
@@ -115,6 +142,7 @@ private:
     CDataCtrl& m_data;
     CPoverInfo m_poverInfo;
     CStaticReader m_static;
+    CStagedReader m_staged;
     int m_mode = 0;
     int m_pushover = 0;
     int m_step = 0;

@@ -1,7 +1,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_db/postctrl.h"
 
-// Results of static load cases and their combinations.
+// Results of static load cases, of their combinations and of construction stages.
 
 using zql::lib::MMSGFunction;
 
@@ -27,58 +27,111 @@ void CPostCtrl::ToCurrentUnits(T_DOF6& values, T_DIM linear, T_DIM angular) cons
         values[i] = FromSi(values[i], m_data.Units(), i < 3 ? linear : angular);
 }
 
-int CPostCtrl::GetDispNew(int node, T_DOF6& out)
+// The readers of both families have the same operations.
+
+template <class R>
+int CPostCtrl::ReadNode(R& reader, int (R::*read)(int, T_DOF6&), int node, T_DOF6& out,
+                        T_DIM linear, T_DIM angular)
 {
-    const int done = m_static.ReadDisplacement(node, out);
-    m_error = m_static.Error();
-    if (done) ToCurrentUnits(out, kDimLength, kDimNone);
+    const int done = (reader.*read)(node, out);
+    m_error = reader.Error();
+    if (done) ToCurrentUnits(out, linear, angular);
     return done;
 }
 
-int CPostCtrl::GetReacNew(int node, T_DOF6& out)
-{
-    const int done = m_static.ReadReaction(node, out);
-    m_error = m_static.Error();
-    if (done) ToCurrentUnits(out, kDimForce, kDimMoment);
-    return done;
-}
-
-int CPostCtrl::ReadForces(int element, ELEM_KIND kind, const char* otherKind, T_ELEM_FORCES& out)
+template <class R>
+int CPostCtrl::ReadForces(R& reader, int element, ELEM_KIND kind, T_ELEM_FORCES& out)
 {
     const auto it = m_data.Model().elements.find(element);
     if (it == m_data.Model().elements.end() || it->second.kind != kind) {
-        m_error = MMSGFunction::Format(otherKind, {std::to_string(element)});
+        m_error = MMSGFunction::Format(kind == ELEM_KIND::Truss ? "IDS_QM_DB_RESULT_NO_TRUSS"
+                                                                : "IDS_QM_DB_RESULT_NO_BEAM",
+                                       {std::to_string(element)});
         return 0;
     }
-    const int done = m_static.ReadForces(element, out);
-    m_error = m_static.Error();
+    const int done = reader.ReadForces(element, out);
+    m_error = reader.Error();
     return done;
 }
 
-int CPostCtrl::GetStrtNew(int element, double& axial)
+template <class R>
+int CPostCtrl::ReadTruss(R& reader, int element, double& axial)
 {
     T_ELEM_FORCES forces;
-    if (!ReadForces(element, ELEM_KIND::Truss, "IDS_QM_DB_RESULT_NO_TRUSS", forces)) return 0;
+    if (!ReadForces(reader, element, ELEM_KIND::Truss, forces)) return 0;
     axial = FromSi(forces[0][0], m_data.Units(), kDimForce);
     return 1;
 }
 
-int CPostCtrl::GetStrbNew(int element, int position, T_DOF6& out)
+template <class R>
+int CPostCtrl::ReadBeam(R& reader, int element, int position, T_DOF6& out)
 {
     if (position < 0 || position >= static_cast<int>(kForcePositions)) {
         m_error = MMSGFunction::Format("IDS_QM_DB_RESULT_NO_POSITION", {std::to_string(position)});
         return 0;
     }
     T_ELEM_FORCES forces;
-    if (!ReadForces(element, ELEM_KIND::Beam, "IDS_QM_DB_RESULT_NO_BEAM", forces)) return 0;
+    if (!ReadForces(reader, element, ELEM_KIND::Beam, forces)) return 0;
     out = forces[static_cast<std::size_t>(position)];
     ToCurrentUnits(out, kDimForce, kDimMoment);
     return 1;
+}
+
+int CPostCtrl::GetDispNew(int node, T_DOF6& out)
+{
+    return ReadNode(m_static, &CStaticReader::ReadDisplacement, node, out, kDimLength, kDimNone);
+}
+
+int CPostCtrl::GetReacNew(int node, T_DOF6& out)
+{
+    return ReadNode(m_static, &CStaticReader::ReadReaction, node, out, kDimForce, kDimMoment);
+}
+
+int CPostCtrl::GetStrtNew(int element, double& axial)
+{
+    return ReadTruss(m_static, element, axial);
+}
+
+int CPostCtrl::GetStrbNew(int element, int position, T_DOF6& out)
+{
+    return ReadBeam(m_static, element, position, out);
 }
 
 int CPostCtrl::CheckStaticResult(int loadCase)
 {
     const int done = m_static.CheckCase(loadCase);
     m_error = m_static.Error();
+    return done;
+}
+
+void CPostCtrl::SelectStage(int stage, int step, int load)
+{
+    m_staged.Select({stage, step, load});
+}
+
+int CPostCtrl::GetDspcNew(int node, T_DOF6& out)
+{
+    return ReadNode(m_staged, &CStagedReader::ReadDisplacement, node, out, kDimLength, kDimNone);
+}
+
+int CPostCtrl::GetReccNew(int node, T_DOF6& out)
+{
+    return ReadNode(m_staged, &CStagedReader::ReadReaction, node, out, kDimForce, kDimMoment);
+}
+
+int CPostCtrl::GetStrtcNew(int element, double& axial)
+{
+    return ReadTruss(m_staged, element, axial);
+}
+
+int CPostCtrl::GetStrbcNew(int element, int position, T_DOF6& out)
+{
+    return ReadBeam(m_staged, element, position, out);
+}
+
+int CPostCtrl::CheckStagedResult()
+{
+    const int done = m_staged.Check();
+    m_error = m_staged.Error();
     return done;
 }

@@ -28,6 +28,7 @@ void Fields(V& v, typename V::template Ref<T_STYP_D> r)
     v("wall_strength_degradation", r.wallStrengthDegradation);
     v("gsd", r.gsd);
     v("plane", r.plane);
+    v.BodyIf(r.stageControl, r.stageControl != T_STCT_D{});
 }
 
 template <class V>
@@ -163,6 +164,18 @@ void Fields(V& v, typename V::template Ref<T_ULFC_D> r)
 }
 template <class V>
 void Fields(V& v, typename V::template Ref<T_ULFI_D> r)
+{
+    v("name", r.name);
+    v.Body(r);
+}
+template <class V>
+void Fields(V& v, typename V::template Ref<T_STAG_D> r)
+{
+    v("name", r.name);
+    v.Body(r);
+}
+template <class V>
+void Fields(V& v, typename V::template Ref<T_ULSI_D> r)
 {
     v("name", r.name);
     v.Body(r);
@@ -410,6 +423,8 @@ void WriteModel(const CSqliteDb& db, const T_MODEL& model)
     WriteTable(db, "combinations", model.combinations, arrays);
     WriteTable(db, "ulf_constraints", model.ulfConstraints, arrays);
     WriteTable(db, "ulf_items", model.ulfItems, arrays);
+    WriteTable(db, "stages", model.stages, arrays);
+    WriteTable(db, "ulf_stage_items", model.ulfStageItems, arrays);
     arrays.Write(db);
 }
 
@@ -443,6 +458,8 @@ T_MODEL ReadModel(const CSqliteDb& db, T_TABLE_SUMS& sums)
     model.combinations = ReadTable<T_LCOM_D>(db, "combinations", arrays, sums);
     model.ulfConstraints = ReadTable<T_ULFC_D>(db, "ulf_constraints", arrays, sums);
     model.ulfItems = ReadTable<T_ULFI_D>(db, "ulf_items", arrays, sums);
+    model.stages = ReadTable<T_STAG_D>(db, "stages", arrays, sums);
+    model.ulfStageItems = ReadTable<T_ULSI_D>(db, "ulf_stage_items", arrays, sums);
     GetElements(arrays, model.elements);
     GetHinges(arrays, model.hinges);
     return model;

@@ -2,6 +2,8 @@
 
 #include "qm_db/hingetype.h"
 
+#include <algorithm>
+
 void FitRecord(T_ELEM_D& r)
 {
     const bool beam = r.kind == ELEM_KIND::Beam;
@@ -40,6 +42,21 @@ void FitRecord(T_ULFC_D& r)
         if (!r.compareWithValue) r.value = 0.0;
     }
     if (r.compareWithValue) r.otherId = 0;
+    if (r.stage == 0) r.step = kStageLastStep;
+}
+
+void FitRecord(T_ULSI_D& r)
+{
+    std::stable_partition(r.rows.begin(), r.rows.end(),
+                          [](const T_ULSI_ROW& row) { return row.unknown; });
+    for (T_ULSI_ROW& row : r.rows) {
+        if (row.unknown) {
+            row.factor = 1.0;
+        } else {
+            row.weight = 1.0;
+            row.pretension = false;
+        }
+    }
 }
 
 void FitRecord(T_PHGT_D& r)

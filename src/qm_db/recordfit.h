@@ -12,6 +12,8 @@ void FitRecord(T_STLD_D& r);
 void FitRecord(T_ULFC_D& r);
 /// Curves that are not of their component's type.
 void FitRecord(T_PHGT_D& r);
+/// Rows of unknown factors come first, in their order.
+void FitRecord(T_ULSI_D& r);
 
 template <class T>
 void FitRecord(T&)

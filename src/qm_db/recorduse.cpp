@@ -29,11 +29,28 @@ bool Contains(const std::vector<int>& ids, int id)
 constexpr int kStaticPattern = 0; // kind of a pushover pattern that names a static load case
 
 // By RECORD_KIND.
-constexpr std::array<const char*, 10> kKindKeys{
-    "IDS_QM_DB_USER_ELEMENT",   "IDS_QM_DB_USER_DIAPHRAGM", "IDS_QM_DB_USER_EQUAL",
-    "IDS_QM_DB_USER_LOAD_CASE", "IDS_QM_DB_USER_LCOM",      "IDS_QM_DB_USER_ULF_ITEM",
-    "IDS_QM_DB_USER_STOREY",    "IDS_QM_DB_USER_HINGE",     "IDS_QM_DB_USER_HINGE_TYPE",
-    "IDS_QM_DB_USER_PUSHOVER"};
+constexpr std::array<const char*, 13> kKindKeys{
+    "IDS_QM_DB_USER_ELEMENT",       "IDS_QM_DB_USER_DIAPHRAGM",      "IDS_QM_DB_USER_EQUAL",
+    "IDS_QM_DB_USER_LOAD_CASE",     "IDS_QM_DB_USER_LCOM",           "IDS_QM_DB_USER_ULF_ITEM",
+    "IDS_QM_DB_USER_STOREY",        "IDS_QM_DB_USER_HINGE",          "IDS_QM_DB_USER_HINGE_TYPE",
+    "IDS_QM_DB_USER_PUSHOVER",      "IDS_QM_DB_USER_ULF_CONSTRAINT", "IDS_QM_DB_USER_STAGE",
+    "IDS_QM_DB_USER_ULF_STAGE_ITEM"};
+
+/// Adds the stages of which a part, what comes or what goes, fulfils `uses`.
+template <class F>
+void CollectStages(const T_MODEL& model, T_RECORD_USERS& out, const F& uses)
+{
+    Collect(model.stages, RECORD_KIND::Stage, out,
+            [&](const T_STAG_D& s) { return uses(s.activate) || uses(s.deactivate); });
+}
+
+/// Adds the items of construction stages of which a row fulfils `uses`.
+template <class F>
+void CollectStageItems(const T_MODEL& model, T_RECORD_USERS& out, const F& uses)
+{
+    Collect(model.ulfStageItems, RECORD_KIND::UlfStageItem, out,
+            [&](const T_ULSI_D& item) { return Any(item.rows, uses); });
+}
 
 template <class T>
 std::string Quoted(const T_TABLE<T>& table, int key)
@@ -59,6 +76,7 @@ T_RECORD_USERS UsersOf<T_NODE_D>(const T_MODEL& model, int id)
             [&](const T_STLD_D& c) { return Any(c.nodal, atNode) || Any(c.settlement, atNode); });
     Collect(model.storeys, RECORD_KIND::Storey, users,
             [&](const T_STOR_D& s) { return Contains(s.nodes, id); });
+    CollectStages(model, users, [&](const T_STAG_PART& p) { return Contains(p.supports, id); });
     return users;
 }
 
@@ -72,6 +90,7 @@ T_RECORD_USERS UsersOf<T_ELEM_D>(const T_MODEL& model, int id)
                Any(c.pretension, onElement);
     });
     Collect(model.hinges, RECORD_KIND::Hinge, users, onElement);
+    CollectStages(model, users, [&](const T_STAG_PART& p) { return Contains(p.elements, id); });
     return users;
 }
 
@@ -112,6 +131,9 @@ T_RECORD_USERS UsersOf<T_STLD_D>(const T_MODEL& model, int key)
             return row.kind == kStaticPattern && row.number == key;
         });
     });
+    const auto ofCase = [&](const auto& row) { return row.loadCase == key; };
+    CollectStages(model, users, [&](const T_STAG_PART& p) { return Any(p.loads, ofCase); });
+    CollectStageItems(model, users, ofCase);
     return users;
 }
 
@@ -124,6 +146,16 @@ T_RECORD_USERS UsersOf<T_LCOM_D>(const T_MODEL& model, int key)
     });
     Collect(model.ulfItems, RECORD_KIND::UlfItem, users,
             [&](const T_ULFI_D& item) { return item.combination == key; });
+    return users;
+}
+
+template <>
+T_RECORD_USERS UsersOf<T_STAG_D>(const T_MODEL& model, int key)
+{
+    T_RECORD_USERS users;
+    const auto inStage = [&](const auto& record) { return record.stage == key; };
+    Collect(model.ulfConstraints, RECORD_KIND::UlfConstraint, users, inStage);
+    CollectStageItems(model, users, inStage);
     return users;
 }
 
@@ -145,5 +177,8 @@ std::string DescribeUser(const T_MODEL& model, const T_RECORD_USER& user)
     if (user.kind == RECORD_KIND::Storey) which = Quoted(model.storeys, user.key);
     if (user.kind == RECORD_KIND::HingeType) which = Quoted(model.hingeTypes, user.key);
     if (user.kind == RECORD_KIND::Pushover) which = Quoted(model.pushovers, user.key);
+    if (user.kind == RECORD_KIND::UlfConstraint) which = Quoted(model.ulfConstraints, user.key);
+    if (user.kind == RECORD_KIND::Stage) which = Quoted(model.stages, user.key);
+    if (user.kind == RECORD_KIND::UlfStageItem) which = Quoted(model.ulfStageItems, user.key);
     return zql::lib::MMSGFunction::Format(kKindKeys[static_cast<std::size_t>(user.kind)], {which});
 }

@@ -16,7 +16,10 @@ enum class RECORD_KIND {
     Storey,
     Hinge,
     HingeType,
-    Pushover
+    Pushover,
+    UlfConstraint,
+    Stage,
+    UlfStageItem
 };
 
 struct T_RECORD_USER {
@@ -45,6 +48,8 @@ template <>
 T_RECORD_USERS UsersOf<T_STLD_D>(const T_MODEL& model, int key);
 template <>
 T_RECORD_USERS UsersOf<T_LCOM_D>(const T_MODEL& model, int key);
+template <>
+T_RECORD_USERS UsersOf<T_STAG_D>(const T_MODEL& model, int key);
 template <>
 T_RECORD_USERS UsersOf<T_PHGT_D>(const T_MODEL& model, int key);
 

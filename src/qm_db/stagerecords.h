@@ -38,6 +38,18 @@ struct T_STAG_D {
     bool operator==(const T_STAG_D&) const = default;
 };
 
+/// Keys of stage load results beside those of the load cases: sums over load cases by their group.
+inline constexpr int kStageLoadSum = -1; // all groups
+inline constexpr int kStageLoadDead = -2;
+inline constexpr int kStageLoadErection = -3;
+
+/// Number of a step of a stage, 1 to its steps; 0 it has no such step.
+inline int StageStepNumber(const T_STAG_D& stage, int step)
+{
+    const int number = step == kStageLastStep ? stage.steps : step;
+    return number >= kStageFirstStep && number <= stage.steps ? number : 0;
+}
+
 /// How an element joins a structure that has moved.
 enum class STAGE_BIRTH {
     OnDeformed, // free of stress between its nodes where they are

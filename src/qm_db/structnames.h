@@ -19,5 +19,9 @@ inline constexpr std::array<const char*, 6> kReactionNames{"FX", "FY", "FZ", "MX
 inline constexpr std::array<const char*, 6> kBeamForceNames{"axial",   "shear y",  "shear z",
                                                             "torsion", "moment y", "moment z"};
 inline constexpr std::array<const char*, 5> kPositionNames{"I", "1/4", "2/4", "3/4", "J"};
+/// By STAGE_BIRTH.
+inline constexpr std::array<const char*, 2> kStageBirthNames{"deformed", "design"};
+inline constexpr std::array<const char*, 2> kStageStepNames{"first", "last"};
+
 inline constexpr std::array<const char*, 3> kObjectiveNames{"linear", "square", "min-max"};
 inline constexpr std::array<const char*, 3> kSignNames{"negative", "free", "positive"};

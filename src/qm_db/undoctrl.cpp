@@ -1,5 +1,7 @@
 #include "qm_db/undoctrl.h"
 
+#include "qm_db/editdata.h"
+
 #include <ranges>
 #include <type_traits>
 
@@ -48,6 +50,26 @@ int CUndoCtrl::Redo()
     for (const T_CHANGE_ANY& change : step.changes)
         Apply(model, change, true);
     m_done.push_back(std::move(step));
+    return 1;
+}
+
+int CUndoCtrl::StartEditDB(std::string title)
+{
+    CEditData* const editor = m_data.Editor();
+    return editor ? editor->Begin(std::move(title)) : 0;
+}
+
+int CUndoCtrl::CloseEditDB()
+{
+    CEditData* const editor = m_data.Editor();
+    return editor ? editor->Commit() : 0;
+}
+
+int CUndoCtrl::CancelEditDB()
+{
+    CEditData* const editor = m_data.Editor();
+    if (!editor || !editor->IsOpen()) return 0;
+    editor->Rollback();
     return 1;
 }
 

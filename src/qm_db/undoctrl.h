@@ -42,6 +42,12 @@ public:
     [[nodiscard]] int Undo();
     [[nodiscard]] int Redo();
 
+    /// One undoable command of the document, by its editor: begins, ends and keeps, or takes back.
+    /// 1 done; 0 another step is open, or none is.
+    [[nodiscard]] int StartEditDB(std::string title);
+    [[nodiscard]] int CloseEditDB();
+    [[nodiscard]] int CancelEditDB();
+
     /// For CEditData: keeps a committed step (at most 200) and forgets what was undone.
     void Push(T_UNDO_STEP step);
     void Clear();

@@ -252,7 +252,7 @@ TEST(HingeCase, AFileOfVersion1OpensAndIsSavedAsTheCurrentVersion)
     content.model.pushovers.at(1).control = T_POLC_CONTROL{};
     content.model.styp.gsd = true;
     ASSERT_EQ(1, store.Save(path, content, error)) << error.text;
-    EXPECT_EQ(3, BytesOf(path)[63]);
+    EXPECT_EQ(4, BytesOf(path)[63]);
     ASSERT_EQ(1, CModelStore::CheckWhole(path, error)) << error.text;
     ASSERT_EQ(1, CModelStore().Open(path, OPEN_MODE::ReadOnly, again, error)) << error.text;
     EXPECT_TRUE(SameContent(content, again));
@@ -284,7 +284,7 @@ TEST(HingeCase, FilesWithOlderKeysAndOfVersion2HoldTheSameModel)
     content.model.styp.plane = MODEL_PLANE::XZ;
     content.model.elements.at(4).release.I[4] = true;
     ASSERT_EQ(1, store.Save(path, content, error)) << error.text;
-    EXPECT_EQ(3, BytesOf(path)[63]);
+    EXPECT_EQ(4, BytesOf(path)[63]);
     ASSERT_EQ(1, CModelStore().Open(path, OPEN_MODE::ReadOnly, again, error)) << error.text;
     EXPECT_TRUE(SameContent(content, again));
 }
