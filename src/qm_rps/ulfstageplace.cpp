@@ -1,18 +1,10 @@
 #include "qm_rps/ulfstageplace.h"
 
-#include "qm_base/textformat.h"
-
 #include <algorithm>
 
 namespace {
 
 constexpr int kPerStage = kStageStepsMost + 1;
-
-std::string StepText(int step)
-{
-    if (step == kStageLastStep) return "Last Step";
-    return step == kStageFirstStep ? "First Step" : FormatText("User Step:%2d", step);
-}
 
 } // namespace
 
@@ -32,20 +24,12 @@ int StepOfUlfNumber(int number)
     return step == 0 ? kStageLastStep : step;
 }
 
-std::string UlfStageText(const T_MODEL& model, int stage, int step)
-{
-    const auto it = model.stages.find(stage);
-    const std::string name = it == model.stages.end() ? std::string() : it->second.name;
-    return FormatText("%s/%s", name.c_str(), StepText(step).c_str());
-}
-
 int UlfStepNumber(const T_MODEL& model, int stage, int step)
 {
     const auto it = model.stages.find(stage);
     if (it == model.stages.end()) return 0;
-    const int last = std::min(it->second.steps, kStageStepsMost);
-    const int number = step == kStageLastStep ? last : step;
-    return number >= 1 && number <= last ? number : 0;
+    const int number = StageStepNumber(it->second, step);
+    return number <= kStageStepsMost ? number : 0;
 }
 
 std::vector<int> LoadsActingAt(const T_MODEL& model, int stage, int step)

@@ -1,4 +1,4 @@
-// Stage and step as one number, as text, and what acts there.
+// Stage and step as one number, and what acts there.
 #pragma once
 
 #include "qm_db/records.h"
@@ -11,9 +11,6 @@ inline constexpr int kStageStepsMost = 999;
 int UlfStageNumber(int stage, int step);
 int StageOfUlfNumber(int number);
 int StepOfUlfNumber(int number); // kStageLastStep for the last one
-
-/// "S1/First Step", "S1/User Step: 2", "S1/Last Step". A stage that is gone has no name.
-std::string UlfStageText(const T_MODEL& model, int stage, int step);
 
 /// The step's number in its stage: the last one is the number of steps. 0: no such stage or step.
 int UlfStepNumber(const T_MODEL& model, int stage, int step);

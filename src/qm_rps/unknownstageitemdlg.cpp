@@ -4,7 +4,6 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/ulfchecks.h"
-#include "qm_rps/ulfstageplace.h"
 
 #include <algorithm>
 
@@ -21,6 +20,13 @@ std::string CaseName(const T_MODEL& model, int key)
 {
     const auto it = model.loadCases.find(key);
     return it == model.loadCases.end() ? std::string() : it->second.name;
+}
+
+/// "S1/First Step"; empty for a place that is gone.
+std::string PlaceName(CDBDoc& doc, const T_ULSI_ROW& row)
+{
+    T_STAG_STEP_INFO info;
+    return doc.Attr().GetStagStepInfo(row.stage, row.step, info) ? info.Text() : std::string();
 }
 
 } // namespace
@@ -79,7 +85,7 @@ std::string CUnknownStageItemDlg::CellText(std::size_t row, COLUMN column) const
     const T_MODEL& model = m_doc.Data().Model();
     switch (column) {
     case Stage:
-        return UlfStageText(model, r.stage, r.step);
+        return PlaceName(m_doc, r);
     case LoadCase:
         return CaseName(model, r.loadCase);
     case Unknown:
