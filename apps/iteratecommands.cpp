@@ -178,7 +178,10 @@ EXIT_CODE RunUlfIterate(const T_ITERATE_OPTIONS& o)
     CIterateView view(o.overwrite);
     dialog.SetView(&view);
     CUlfIterationDocHost host(doc, dialog, &view);
-    CUlfIteration run(host, {o.iterations, o.tolerance});
+    CUnknownLoadFactorIterAnal* settings = CUnknownLoadFactorIterAnal::Of(doc.DynModules());
+    if (!settings || !settings->Set({o.iterations, o.tolerance}))
+        return Complain(EXIT_CODE::Usage, "the settings of the iteration were refused");
+    CUlfIteration run(host, settings->Settings());
     run.m_progress = ShowProgress;
     const T_INTERRUPT interrupt;
     const int done = dialog.OnIterate(run);

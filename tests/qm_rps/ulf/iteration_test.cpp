@@ -357,7 +357,6 @@ TEST_F(UlfIteration, LeavesTheLoadsWhenOneOfThemCannotBeChanged)
 {
     T_MODEL_CONTENT content = two::Content();
     content.model.loadCases[2].pretension.push_back({9, 1.0}); // there is no such element
-    content.model.ulfStageItems[1].rows[1].pretension = true;
     CDBDoc doc;
     doc.Data().Assign(std::move(content));
     CUlfStageResults results(doc);

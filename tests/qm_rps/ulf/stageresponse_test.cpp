@@ -148,11 +148,11 @@ TEST(StageProblem, NamesEachRuleThatAnItemDoesNotKeep)
         {"IDS_QM_ULSI_PLACE", [](ITEM& i) { i.rows[0].stage = 9; }},
         {"IDS_QM_ULSI_CASE", [](ITEM& i) { i.rows[0].loadCase = 9; }},
         {"IDS_QM_ULSI_GROUP", [](ITEM& i) { i.rows[0].loadGroup = 3; }},
-        {"IDS_QM_ULSI_NUMBER", [](ITEM& i) { i.rows[1].weight = -1; }},
+        {"IDS_QM_ULSI_NUMBER", [](ITEM& i) { i.rows[0].weight = -1; }},
         {"IDS_QM_ULSI_TWICE", [](ITEM& i) { i.rows.push_back(i.rows[0]); }},
         {"IDS_QM_ULFI_SIGN", [](ITEM& i) { i.sign = 3; }},
-        {"IDS_RPS_No_Unknown_Load_Factor_defined_", [](ITEM& i) { i.rows.pop_back(); }},
-        {"IDS_QM_ULSI_NO_PRETENSION", [](ITEM& i) { i.rows[1].loadCase = 1; }},
+        {"IDS_RPS_No_Unknown_Load_Factor_defined_", [](ITEM& i) { i.rows.erase(i.rows.begin()); }},
+        {"IDS_QM_ULSI_NO_PRETENSION", [](ITEM& i) { i.rows[0].loadCase = 1; }},
         {"IDS_QM_ULSI_SCALED_TWICE",
          [](ITEM& i) {
              i.rows.push_back({1, kStageLastStep, 2, true, 1, 1, true, 0});

@@ -39,8 +39,8 @@ inline T_MODEL_CONTENT Content()
     hold.id = 2;
     T_ULSI_D& item = m.ulfStageItems[1];
     item.name = "STAY";
-    item.rows = {{1, kStageFirstStep, 1, false, 1.0, 1.0, false, kLoadGroupDead},
-                 {1, kStageFirstStep, 2, true, 1.0, 1.0, true, kLoadGroupRest}};
+    item.rows = {{1, kStageFirstStep, 2, true, 1.0, 1.0, true, kLoadGroupRest},
+                 {1, kStageFirstStep, 1, false, 1.0, 1.0, false, kLoadGroupDead}};
     item.constraints = {"HOLD"};
     return content;
 }
