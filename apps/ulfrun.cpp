@@ -91,7 +91,7 @@ T_ULF_OUTCOME SolveUlf(CUnknownLoadFactorItemDlg& dialog)
     const bool solved = dialog.OnCalculate();
     const auto& run = dialog.LastRun();
     if (run) out.solverCode = run->answer.code;
-    out.exact = dialog.m_solveByEquations;
+    out.exact = dialog.m_solveByEquations || (run && run->answer.exact);
     if (!dialog.Messages().empty()) out.message = OneLine(dialog.Messages().back().text);
     if (solved) {
         out.exact = dialog.Result()->exact;
@@ -103,7 +103,9 @@ T_ULF_OUTCOME SolveUlf(CUnknownLoadFactorItemDlg& dialog)
             out.message = MMSGFunction::GetValue("IDS_RPS_Unknown_CAN_FIND_OPTIMIZED_SOLUTION");
         return out;
     }
-    const bool none = run && SaysNoSolution(out.solverCode);
+    // A numbered constraint or factor: the restriction of the signs leaves nothing.
+    const bool none = run && (SaysNoSolution(out.solverCode) || run->answer.constraint > 0 ||
+                              run->answer.factor > 0);
     out.status = none ? "not found" : "refused";
     out.code = none ? EXIT_CODE::NotFound : EXIT_CODE::BadInput;
     return out;

@@ -271,6 +271,22 @@ TEST(Ulf, RefusalsHaveTheirExitCodesAndLeaveNothing)
     EXPECT_TRUE(folder.Names().empty());
 }
 
+// The props push upward (factors 43/38 and 37/38), which the sign forbids.
+TEST(Ulf, EquationsWhoseOnlyFactorsHaveTheWrongSignHaveNoSolution)
+{
+    const CTempFolder folder;
+    const std::string file = folder / "c.json";
+    json document = json::parse(ReadText(ExampleCase("tuned-beam")));
+    json& item = document.at("ulf_items").at(0);
+    ASSERT_EQ("PROPS", item.at("name"));
+    item["sign"] = "negative";
+    WriteText(file, document.dump());
+    const json none = Solved(file, "PROPS", 1);
+    EXPECT_EQ("not found", none.at("status"));
+    EXPECT_EQ("[EXACT]", none.at("mode"));
+    EXPECT_TRUE(none.at("factors").empty());
+}
+
 TEST(Ulf, BrokenItemsAreListedByCheckAndRefusedBySolve)
 {
     const struct {
