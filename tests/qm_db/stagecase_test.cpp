@@ -1,1 +1,277 @@
+// Construction stages in the case file, in the model file and in a document.
+#include "modelstoresample.h"
+#include "qm_db/casefile.h"
+#include "qm_db/dbdoc.h"
+
+#include <cmath>
 #include <gtest/gtest.h>
+
+namespace {
+
+const std::string kData = QM_TEST_DATA;
+
+std::string AllText()
+{
+    return BytesOf(kData + "/cases/stage_all_members.json");
+}
+
+int Parse(const std::string& text, T_MODEL_CONTENT& content, T_FILE_ERROR& error)
+{
+    return CCaseFile::Parse(text, "case.json", "", content, error);
+}
+
+T_MODEL_CONTENT ParseGood(const std::string& text)
+{
+    T_MODEL_CONTENT content;
+    T_FILE_ERROR error;
+    EXPECT_EQ(1, Parse(text, content, error)) << error.text;
+    return content;
+}
+
+std::string PrintGood(const T_MODEL_CONTENT& content)
+{
+    std::string text;
+    T_FILE_ERROR error;
+    EXPECT_EQ(1, CCaseFile::Print(content, text, error)) << error.text;
+    return text;
+}
+
+std::string UsersAsText(const T_MODEL& model, const T_RECORD_USERS& users)
+{
+    std::string text;
+    for (const T_RECORD_USER& user : users)
+        text += (text.empty() ? "" : ", ") + DescribeUser(model, user);
+    return text;
+}
+
+} // namespace
+
+TEST(StageCase, ReadsEveryMemberIntoItsField)
+{
+    const T_MODEL m = ParseGood(AllText()).model;
+    EXPECT_EQ((T_STCT_D{STAGE_BIRTH::ToDesign, true, true}), m.styp.stageControl);
+    EXPECT_EQ((T_STAG_D{"S1", {{1}, {1}, {{1, 1}}}, {}, 1, 0.0}), m.stages.at(1));
+    EXPECT_EQ((T_STAG_D{"S2", {{2}, {}, {{2, -1}}}, {}, 3, 7.5}), m.stages.at(2));
+    EXPECT_EQ((T_STAG_D{"S3", {{3}, {4}, {{3, 2}}}, {{2}, {}, {{2, 1}}}, 2, 0.0}), m.stages.at(5));
+    EXPECT_EQ(0, m.loadCases.at(1).group);
+    EXPECT_EQ(1, m.loadCases.at(2).group);
+    EXPECT_EQ(2, m.loadCases.at(3).group);
+    EXPECT_EQ(5, m.ulfConstraints.at(1).stage);
+    EXPECT_EQ(-1, m.ulfConstraints.at(1).step);
+    EXPECT_EQ(2, m.ulfConstraints.at(2).step);
+    EXPECT_EQ(0, m.ulfConstraints.at(3).stage);
+    const std::vector<T_ULSI_ROW> rows{{5, 2, 3, true, 1.0, 2.0, true, 2},
+                                       {1, 1, 1, true, 1.0, 1.0, false, 0},
+                                       {2, -1, 2, false, 1.5, 1.0, false, 1}};
+    EXPECT_EQ((T_ULSI_D{"tune", rows, 1, 2, true, {"tip"}}), m.ulfStageItems.at(1));
+}
+
+TEST(StageCase, CaseFileAndModelFileGiveTheSameModelBack)
+{
+    const T_MODEL_CONTENT content = ParseGood(AllText());
+    const std::string text = PrintGood(content);
+    EXPECT_TRUE(SameContent(content, ParseGood(text)));
+    EXPECT_EQ(text, PrintGood(ParseGood(text)));
+
+    const CTempFolder folder;
+    T_MODEL_CONTENT stored;
+    T_FILE_ERROR error;
+    ASSERT_EQ(1, CModelStore().Save(folder.File("m.qmdb"), content, error)) << error.text;
+    ASSERT_EQ(1, CModelStore().Open(folder.File("m.qmdb"), OPEN_MODE::ReadOnly, stored, error));
+    EXPECT_TRUE(SameContent(content, stored));
+    EXPECT_EQ(text, PrintGood(stored));
+}
+
+// Written by the program when it knew version 3, out of struct_all_members.json.
+TEST(StageCase, AFileOfVersion3OpensAndTakesStages)
+{
+    const CTempFolder folder;
+    const std::string path = folder.File("model.qmdb");
+    WriteBytes(path, BytesOf(kData + "/model-v3.qmdb"));
+    ASSERT_EQ(3, BytesOf(path)[63]); // user_version, last byte
+    T_MODEL_CONTENT source, content, again;
+    T_FILE_ERROR error;
+    ASSERT_EQ(1, CCaseFile::Read(kData + "/cases/struct_all_members.json", source, error));
+    CModelStore store;
+    ASSERT_EQ(1, store.Open(path, OPEN_MODE::Edit, content, error)) << error.text;
+    EXPECT_TRUE(SameContent(source, content));
+    content.model.stages[1] = {"S1", {{1}, {1}, {{1, -1}}}, {}, 2, 3.0};
+    content.model.styp.stageControl.cableSag = true;
+    content.model.ulfConstraints.at(1).stage = 1;
+    ASSERT_EQ(1, store.Save(path, content, error)) << error.text;
+    EXPECT_EQ(4, BytesOf(path)[63]);
+    ASSERT_EQ(1, CModelStore().Open(path, OPEN_MODE::ReadOnly, again, error)) << error.text;
+    EXPECT_TRUE(SameContent(content, again));
+}
+
+TEST(StageCase, BadInputNamesThePlace)
+{
+    struct T_ROW {
+        const char* after;
+        const char* from;
+        const char* to;
+        const char* message;
+    };
+    // clang-format off
+    const T_ROW rows[] = {
+        {"stage_control", "\"design\"", "\"old\"", "stage_control.birth: unknown birth of elements \"old\"; allowed: deformed, design"},
+        {"stage_control", "cable_sag", "sag", "stage_control: unknown key \"sag\""},
+        {"load_cases", "\"load_group\": 0", "\"load_group\": 3", "load_cases[0].load_group: a load group is 0, 1 or 2"},
+        {"\"stages\"", "\"S2\"", "\"S1\"", "stages[1].name: \"S1\" appears twice"},
+        {"\"stages\"", "[1]", "[9]", "stages[0].activate.elements[0]: there is no such element"},
+        {"\"stages\"", "[1]", "[1, 1]", "stages[0].activate.elements[1]: the element appears twice"},
+        {"\"stages\"", "\"supports\": [1]", "\"supports\": [8]", "stages[0].activate.supports[0]: there is no such node"},
+        {"\"stages\"", "\"case\": \"G\"", "\"case\": \"H\"", "stages[0].activate.loads[0].case: there is no such load case"},
+        {"\"stages\"", "\"case\": \"G\"", "\"case\": \"G\", \"step\": 0", "stages[0].activate.loads[0].step: steps count from 1"},
+        {"\"stages\"", "\"step\": \"last\"", "\"step\": \"end\"", "stages[1].activate.loads[0].step: unknown step \"end\"; allowed: first, last"},
+        {"\"stages\"", "\"steps\": 3", "\"steps\": 0", "stages[1].steps: a stage has at least one step"},
+        {"\"stages\"", "7.5", "-7.5", "stages[1].duration: the value can't be negative"},
+        {"\"stages\"", "\"activate\"", "\"active\"", "stages[0]: unknown key \"active\""},
+        {"ulf_constraints", "\"S3\"", "\"S4\"", "ulf_constraints[0].stage: there is no such stage"},
+        {"ulf_constraints", "\"stage\": \"S2\", ", "", "ulf_constraints[1].step: a step needs a stage"},
+        {"ulf_stage_items", "\"S3\"", "\"S4\"", "ulf_stage_items[0].unknown[0].stage: there is no such stage"},
+        {"ulf_stage_items", "\"T\"", "\"U\"", "ulf_stage_items[0].unknown[0].case: there is no such load case"},
+        {"ulf_stage_items", "\"weight\"", "\"factor\"", "ulf_stage_items[0].unknown[0]: unknown key \"factor\""},
+        {"ulf_stage_items", "\"factor\"", "\"weight\"", "ulf_stage_items[0].known[0]: unknown key \"weight\""},
+        {"ulf_stage_items", "\"load_group\": 1", "\"load_group\": -1", "ulf_stage_items[0].known[0].load_group: a load group is 0, 1 or 2"},
+    };
+    // clang-format on
+    for (const T_ROW& row : rows) {
+        std::string text = AllText();
+        const std::size_t at = text.find(row.from, text.find(row.after));
+        ASSERT_NE(std::string::npos, at) << row.from;
+        text.replace(at, std::string(row.from).size(), row.to);
+        T_MODEL_CONTENT content;
+        T_FILE_ERROR error;
+        EXPECT_EQ(0, Parse(text, content, error)) << row.message;
+        EXPECT_NE(std::string::npos, error.text.find(row.message))
+            << error.text << "\nexpected " << row.message;
+    }
+}
+
+TEST(StageCase, StepsHaveNamesAndARunningNumber)
+{
+    CDBDoc doc;
+    doc.Data().Assign(ParseGood(AllText()));
+    const char* const expected[] = {"S1/First Step", "S2/First Step", "S2/User Step: 2",
+                                    "S2/Last Step",  "S3/First Step", "S3/Last Step"};
+    T_STAG_STEP_INFO info;
+    for (int i = 0; i < 6; ++i) {
+        ASSERT_EQ(1, doc.Attr().GetStagStepInfo(i + 1, info)) << i;
+        EXPECT_EQ(expected[i], info.Text());
+    }
+    EXPECT_EQ(5, info.stage);
+    EXPECT_EQ(-1, info.step);
+    EXPECT_EQ(0, doc.Attr().GetStagStepInfo(7, info));
+    EXPECT_EQ(0, doc.Attr().GetStagStepInfo(0, info));
+    ASSERT_EQ(1, doc.Attr().GetStagStepInfo(2, 3, info)); // the last one by its number
+    EXPECT_EQ("Last Step", info.stepName);
+    EXPECT_EQ(0, doc.Attr().GetStagStepInfo(2, 4, info));
+    EXPECT_EQ(0, doc.Attr().GetStagStepInfo(3, 1, info));
+}
+
+TEST(StageCase, NamesOfStageLoadsGiveTheirKeys)
+{
+    CDBDoc doc;
+    doc.Data().Assign(ParseGood(AllText()));
+    int key = 0;
+    ASSERT_EQ(1, doc.Attr().GetSgldKey("Sum of the stage loads", key));
+    EXPECT_EQ(kStageLoadSum, key);
+    ASSERT_EQ(1, doc.Attr().GetSgldKey("Dead load of the stages", key));
+    EXPECT_EQ(kStageLoadDead, key);
+    ASSERT_EQ(1, doc.Attr().GetSgldKey("Erection load of the stages", key));
+    EXPECT_EQ(kStageLoadErection, key);
+    ASSERT_EQ(1, doc.Attr().GetSgldKey("T", key));
+    EXPECT_EQ(3, key);
+    EXPECT_EQ(0, doc.Attr().GetSgldKey("U", key));
+}
+
+// 10 kN are 10000 N; the document is switched to N and mm. Other loads keep every digit.
+TEST(StageCase, PretensionIsReplacedInCurrentUnitsAsAStepThatCanBeTakenBack)
+{
+    CDBDoc doc;
+    T_MODEL_CONTENT content = ParseGood(AllText());
+    content.model.styp.units = {FORCE_UNIT::N, LENGTH_UNIT::mm};
+    content.model.loadCases.at(3).pretension = {{3, 4000.0}, {2, 1.0}, {3, 6000.0}};
+    content.model.loadCases.at(3).nodal = {{2, {0.1, 0.2, 0.3, 0.4, 0.5, 0.6}}};
+    doc.Data().Assign(content);
+    const T_MODEL before = doc.Data().Model();
+    T_PTNS_D load;
+    ASSERT_EQ(1, doc.Attr().GetPtns(3, 3, load));
+    EXPECT_EQ((T_PTNS_D{3, 10000.0}), load);
+    EXPECT_EQ(0, doc.Attr().GetPtns(3, 1, load));
+    EXPECT_EQ(0, doc.Attr().GetPtns(9, 3, load));
+
+    EXPECT_EQ(0, doc.Edit().AddPtns(3, {3, 1.0})); // no step is open
+    ASSERT_EQ(1, doc.Undo().StartEditDB("scale"));
+    EXPECT_EQ(0, doc.Undo().StartEditDB("again"));
+    EXPECT_EQ(0, doc.Edit().AddPtns(9, {3, 1.0}));
+    EXPECT_EQ(0, doc.Edit().AddPtns(3, {8, 1.0}));
+    EXPECT_EQ(0, doc.Edit().AddPtns(3, {3, std::nan("")}));
+    ASSERT_EQ(1, doc.Edit().AddPtns(3, {3, 12500.0}));
+    ASSERT_EQ(1, doc.Edit().AddPtns(1, {3, 7.0}));
+    ASSERT_EQ(1, doc.Undo().CloseEditDB());
+    EXPECT_EQ(0, doc.Undo().CloseEditDB());
+    T_MODEL expected = before;
+    expected.loadCases.at(3).pretension = {{3, 12500.0}, {2, 1.0}};
+    expected.loadCases.at(1).pretension = {{3, 7.0}};
+    EXPECT_EQ(expected, doc.Data().Model());
+    EXPECT_EQ("scale", doc.Undo().UndoTitle());
+    ASSERT_EQ(1, doc.Undo().Undo());
+    EXPECT_EQ(before, doc.Data().Model());
+
+    ASSERT_EQ(1, doc.Undo().StartEditDB("cancelled"));
+    ASSERT_EQ(1, doc.Edit().AddPtns(3, {3, 1.0}));
+    ASSERT_EQ(1, doc.Undo().CancelEditDB());
+    EXPECT_EQ(0, doc.Undo().CancelEditDB());
+    EXPECT_EQ(before, doc.Data().Model());
+}
+
+TEST(StageCase, WhatStagesUseIsNotDeleted)
+{
+    CDBDoc doc;
+    doc.Data().Assign(ParseGood(AllText()));
+    ASSERT_EQ(1, doc.Edit().Begin("erase"));
+    T_RECORD_USERS users;
+    const T_MODEL& m = doc.Data().Model();
+    EXPECT_EQ(0, doc.Edit().Erase<T_ELEM_D>(2, users));
+    EXPECT_EQ("construction stage \"S2\", construction stage \"S3\"", UsersAsText(m, users));
+    EXPECT_EQ(0, doc.Edit().Erase<T_NODE_D>(4, users));
+    EXPECT_EQ("element 3, construction stage \"S3\"", UsersAsText(m, users));
+    EXPECT_EQ(0, doc.Edit().Erase<T_STLD_D>(3, users));
+    EXPECT_EQ("construction stage \"S3\", unknown load factor item \"tune\" of construction stages",
+              UsersAsText(m, users));
+    EXPECT_EQ(0, doc.Edit().Erase<T_STAG_D>(2, users));
+    EXPECT_EQ("constraint \"mid\" of unknown load factors, unknown load factor item \"tune\" of "
+              "construction stages",
+              UsersAsText(m, users));
+    EXPECT_EQ(1, doc.Edit().Erase<T_STLD_D>(4, users));
+    EXPECT_EQ(1, doc.Edit().Erase<T_ULSI_D>(1, users));
+    EXPECT_EQ(1, doc.Edit().Commit());
+    ASSERT_EQ(1, doc.Undo().Undo());
+    EXPECT_EQ(ParseGood(AllText()).model, m);
+}
+
+// The case file has unknown rows before known ones: a record that was put in keeps that order.
+TEST(StageCase, RowsThatAreEditedComeBackFromEveryFile)
+{
+    CDBDoc doc;
+    doc.Data().Assign(ParseGood(AllText()));
+    T_ULSI_D item;
+    ASSERT_EQ(1, doc.Attr().GetUlsi(1, item));
+    std::swap(item.rows[0], item.rows[2]);
+    item.rows[0].weight = 3.0; // of a known row: not used
+    item.rows[0].pretension = true;
+    item.rows[2].factor = 2.0; // of an unknown one
+    ASSERT_EQ(1, doc.Edit().Begin("rows"));
+    ASSERT_EQ(1, doc.Edit().Put(1, item));
+    ASSERT_EQ(1, doc.Edit().Commit());
+    const T_MODEL back = ParseGood(PrintGood(doc.Data().Content())).model;
+    EXPECT_EQ(doc.Data().Model().ulfStageItems, back.ulfStageItems);
+    const std::vector<T_ULSI_ROW>& rows = back.ulfStageItems.at(1).rows;
+    ASSERT_EQ(3U, rows.size());
+    EXPECT_EQ(1, rows[0].stage);
+    EXPECT_EQ(5, rows[1].stage);
+    EXPECT_EQ(1.0, rows[1].factor);
+    EXPECT_EQ((T_ULSI_ROW{2, -1, 2, false, 1.5, 1.0, false, 1}), rows[2]);
+}
