@@ -22,13 +22,19 @@ T_PLOT_SERIES FactorSeries(const std::vector<T_ULF_ITER_STEP>& history, std::siz
     return s;
 }
 
-T_PLOT_SERIES ToleranceSeries(const std::vector<T_ULF_ITER_STEP>& history)
+/// What lies this far below the wanted tolerance is drawn there: a tolerance may get to 0.
+double Floor(const T_ULF_ITER_SETTINGS& settings)
+{
+    return std::max(1e-16, 1e-3 * settings.tolerance);
+}
+
+T_PLOT_SERIES ToleranceSeries(const std::vector<T_ULF_ITER_STEP>& history, double floor)
 {
     T_PLOT_SERIES s;
     s.name = "Tolerance";
     for (const T_ULF_ITER_STEP& step : history) {
         s.x.push_back(step.iteration);
-        s.y.push_back(step.tolerance);
+        s.y.push_back(std::max(step.tolerance, floor));
     }
     s.line = PLOT_LINE::Solid;
     s.width = 2.6;
@@ -54,7 +60,10 @@ T_PLOT IterationPlot(const std::string& item, const T_ULF_ITER_SETTINGS& setting
         plot.x.labels.push_back({double(step.iteration), std::to_string(step.iteration)});
     plot.y.title = "Factor, tolerance (-)";
     plot.y.log = true;
-    plot.series.push_back(ToleranceSeries(history));
+    const double floor = Floor(settings);
+    plot.series.push_back(ToleranceSeries(history, floor));
+    if (std::ranges::any_of(history, [&](const auto& step) { return step.tolerance < floor; }))
+        plot.notes.push_back(FormatText("Tolerances below %.3g are drawn there", floor));
     const std::vector<T_ULF_ITER_ROW>& last = history.back().rows;
     for (std::size_t row = 0; row < last.size(); ++row) {
         plot.series.push_back(FactorSeries(history, row));
