@@ -1,4 +1,5 @@
 // The arguments of the commands on unknown load factors.
+#include "iteratecommands.h"
 #include "registrations.h"
 #include "ulfcommands.h"
 
@@ -36,18 +37,37 @@ void AddSolve(CLI::App* ulf, const OPTIONS& o, EXIT_CODE& code)
     solve->add_option("--shape-plot", o->shapePlot, "Draw the displacements before and after");
 }
 
+void AddIterate(CLI::App* ulf, EXIT_CODE& code)
+{
+    const auto o = std::make_shared<T_ITERATE_OPTIONS>();
+    auto* sub = ulf->add_subcommand("iterate", "Scale pretension until its factors are 1");
+    sub->add_option("FILE", o->file, "Model file (.qmdb) or case file (.json)")->required();
+    sub->add_option("--item", o->item, "Name of the construction-stage item")->required();
+    sub->add_option("--iterations", o->iterations, "Required number, 0 to 99")
+        ->capture_default_str();
+    sub->add_option("--tolerance", o->tolerance, "Convergence tolerance")->capture_default_str();
+    sub->add_flag("--overwrite", o->overwrite,
+                  "Overwrite the report (FILE with .ulf) if it exists");
+    sub->add_flag("--append", o->append, "Add to it");
+    sub->add_option("--json", o->json, "Write the history as JSON; - for standard output");
+    sub->add_option("--plot", o->plot, "Draw factors and tolerance by iteration");
+    sub->footer("Example:\n  qm-rps ulf iterate bridge.qmdb --item STAYS --tolerance 1e-6");
+    sub->callback([=, &code] { code = RunUlfIterate(*o); });
+}
+
 } // namespace
 
 void AddUlf(CLI::App& app, EXIT_CODE& code)
 {
     auto* ulf = app.add_subcommand("ulf", "Unknown load factors: list, check, solve, explain, "
-                                          "export, combine");
+                                          "export, combine, iterate");
     ulf->require_subcommand(1);
     ulf->footer("Example:\n  qm-rps ulf solve examples/cable-stayed-bridge/case.json --item LEVEL");
     const OPTIONS o = std::make_shared<T_ULF_OPTIONS>();
     AddOne(ulf, "list", "List items and constraints", "", o, RunUlfList, code);
     AddItem(AddOne(ulf, "check", "Check every rule", "", o, RunUlfCheck, code), o, false);
     AddSolve(ulf, o, code);
+    AddIterate(ulf, code);
     auto* explain = AddOne(ulf, "explain", "Say what holds the factors, or what contradicts",
                            " --item \"NO UPLIFT\"", o, RunUlfExplain, code);
     AddItem(explain, o, true);

@@ -22,7 +22,12 @@ void MDialog::ShowMessage(const std::string& key, const std::string& text)
 
 bool MDialog::AskYesNo(const std::string& key)
 {
-    return m_view && m_view->AskYesNo(key, zql::lib::MMSGFunction::GetValue(key));
+    return AskYesNo(key, zql::lib::MMSGFunction::GetValue(key));
+}
+
+bool MDialog::AskYesNo(const std::string& key, const std::string& text)
+{
+    return m_view && m_view->AskYesNo(key, text);
 }
 
 } // namespace zql::frx

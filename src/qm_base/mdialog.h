@@ -19,6 +19,9 @@ public:
     virtual bool AskYesNo(const std::string& key, const std::string& text) = 0;
     /// Shows a child dialog; 1 accepted, 0 cancelled.
     virtual int RunModal(MDialog& child) = 0;
+    /// Handles what has come in while a long operation runs, except closing the window and system
+    /// commands. Nothing by default.
+    virtual void DispatchEvents() {}
 };
 
 struct T_MESSAGE {
@@ -55,6 +58,7 @@ protected:
     void ShowMessage(const std::string& key, const std::string& text);
     /// Asks the person; without a view the answer is no (nothing is guessed).
     bool AskYesNo(const std::string& key);
+    bool AskYesNo(const std::string& key, const std::string& text);
     IDialogView* View() const { return m_view; }
 
 private:

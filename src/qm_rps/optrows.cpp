@@ -29,7 +29,7 @@ std::optional<T_OPT_READING> ReadRecord(const T_OPT_RECORD& record)
     const std::size_t shift = kind == kBeam ? 1 : 0; // the position stands before the component
     T_OPT_READING r;
     r.first = {kind, Truncated(record[1]), shift ? Truncated(record[2]) : 0,
-               Truncated(record[2 + shift])};
+               Truncated(record[2 + shift]), Truncated(record.back())};
     r.value = record[3 + shift];
     r.relation = Truncated(record[4 + shift]);
     if (Truncated(record[5 + shift]) == 0) {

@@ -11,7 +11,8 @@
 /// Kinds 1 to 3: 0 kind, 1 node or element, 2 component (from 1), 3 value, 4 relation (0 equal,
 /// -1 at most, 1 at least), 5 comparison (1 with the value, 0 with the same quantity of another
 /// node or element), 6 that other one. Kind 4 has its position (from 1) at 2, the rest one later.
-using T_OPT_RECORD = std::array<double, 8>;
+/// Last entry, construction stage only: stage and step where it is read, 0 those of the item.
+using T_OPT_RECORD = std::array<double, 9>;
 
 /// A row: coefficients (one per unknown item, in item order) times the factors, related to rhs.
 struct T_OPT_ROW {

@@ -178,15 +178,20 @@ std::vector<T_FINDING> CheckUlfItem(const T_ULFI_D& item, int ownKey, const T_MO
     std::vector<T_FINDING> out;
     WalkRules(std::span<const T_RULE<I>>(kItemRules), {item, model, ownKey, cases}, {}, out);
     FillTexts(out, item.name);
-    for (const std::string& name : item.constraints) {
-        const int key = FindUlfConstraint(model, name);
-        if (key == 0) continue;
-        for (T_FINDING& f : CheckUlfConstraint(model.ulfConstraints.at(key), key, model)) {
-            f.field = "constraints[" + name + "]." + f.field;
-            out.push_back(std::move(f));
-        }
-    }
+    for (const std::string& name : item.constraints)
+        AddConstraintFindings(name, model, out);
     return out;
+}
+
+void AddConstraintFindings(const std::string& name, const T_MODEL& model,
+                           std::vector<T_FINDING>& out)
+{
+    const int key = FindUlfConstraint(model, name);
+    if (key == 0) return;
+    for (T_FINDING& f : CheckUlfConstraint(model.ulfConstraints.at(key), key, model)) {
+        f.field = "constraints[" + name + "]." + f.field;
+        out.push_back(std::move(f));
+    }
 }
 
 int FindUlfConstraint(const T_MODEL& model, const std::string& name)

@@ -21,5 +21,10 @@ std::vector<T_FINDING> CheckUlfConstraint(const T_ULFC_D& constraint, int ownKey
 std::vector<T_FINDING> CheckUlfItem(const T_ULFI_D& item, int ownKey, const T_MODEL& model,
                                     const std::optional<std::vector<T_LCOM_ITEM>>& cases);
 
+/// Appends what the model's constraint of that name does not keep, field "constraints[NAME].id";
+/// nothing where there is none.
+void AddConstraintFindings(const std::string& name, const T_MODEL& model,
+                           std::vector<T_FINDING>& out);
+
 /// Key of the constraint of that name; 0: none.
 int FindUlfConstraint(const T_MODEL& model, const std::string& name);

@@ -9,7 +9,7 @@
 
 /// Load case item of the optimizer. Static: 0 key of the load case, 1 known factor (below 1e-12 in
 /// absolute value: unknown), 2 weight of an unknown case, 3 unused. Construction stage: 0 stage and
-/// step whose results are read, 3 load group. Integers are stored as doubles.
+/// step whose results are read (see UlfStageNumber), 3 load group. Integers are stored as doubles.
 using T_OPT_ITEM = std::array<double, 4>;
 
 /// A response quantity of the structure.
@@ -18,6 +18,7 @@ struct T_OPT_QUANTITY {
     int id = 0;        // node or element
     int position = 0;  // of a beam, 1 I-end to 5 J-end; else 0
     int component = 0; // from 1
+    int at = 0;        // stage and step where it is read (UlfStageNumber); 0: those of the item
     auto operator<=>(const T_OPT_QUANTITY&) const = default;
 };
 

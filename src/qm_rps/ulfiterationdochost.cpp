@@ -1,0 +1,91 @@
+#include "qm_rps/ulfiterationdochost.h"
+
+#include "qm_base/messagehistory.h"
+#include "qm_base/msgfunction.h"
+
+#include <set>
+
+using zql::lib::MMSGFunction;
+
+int CUlfIterationDocHost::Refuse(const std::string& text)
+{
+    m_error = text;
+    GSaveHistoryFormatNF("%s", text.c_str());
+    return 0;
+}
+
+int CUlfIterationDocHost::Solve(std::vector<T_ULF_ITER_ROW>& rows)
+{
+    if (!m_dialog.OnCalculate()) {
+        m_error = m_dialog.Messages().empty() ? "" : m_dialog.Messages().back().text;
+        return 0;
+    }
+    rows = m_dialog.SolvedRows();
+    return 1;
+}
+
+int CUlfIterationDocHost::SaveCopy(const std::string& path)
+{
+    T_FILE_ERROR error;
+    return m_doc.SaveAs(path, error) ? 1 : Refuse(error.text);
+}
+
+int CUlfIterationDocHost::StartEdit(const std::string& title)
+{
+    return m_doc.Undo().StartEditDB(title);
+}
+
+int CUlfIterationDocHost::ScaleLoad(int loadCase, double factor)
+{
+    T_STLD_D load;
+    if (!m_doc.Attr().GetStld(loadCase, load)) return 0;
+    std::set<int> elements; // several tensions of one element are read and written as one
+    for (const T_PTNS_D& p : load.pretension)
+        elements.insert(p.element);
+    for (const int element : elements) {
+        T_PTNS_D pretension;
+        bool done = m_doc.Attr().GetPtns(loadCase, element, pretension) != 0;
+        pretension.force *= factor;
+        done = done && m_doc.Edit().AddPtns(loadCase, pretension);
+        if (!done)
+            return Refuse(MMSGFunction::Format("IDS_QM_ULF_PRETENSION_NOT_CHANGED",
+                                               {std::to_string(element), load.name}));
+    }
+    return 1;
+}
+
+int CUlfIterationDocHost::ScalePretension(std::size_t unknown, double factor)
+{
+    const T_ULSI_ROW& row = m_dialog.m_rows[m_dialog.RowOfUnknown(unknown)];
+    for (const int loadCase : LoadsScaledBy(m_doc.Data().Model(), row))
+        if (!ScaleLoad(loadCase, factor)) return 0;
+    return 1;
+}
+
+int CUlfIterationDocHost::CloseEdit()
+{
+    return m_doc.Undo().CloseEditDB();
+}
+
+void CUlfIterationDocHost::CancelEdit()
+{
+    if (m_doc.Edit().IsOpen()) (void)m_doc.Undo().CancelEditDB();
+}
+
+int CUlfIterationDocHost::StartAnalysis()
+{
+    T_ANALYSIS_OPTIONS options;
+    options.allCases = false;
+    options.progress = [this](std::size_t, std::size_t) {
+        DispatchEvents();
+        return true;
+    };
+    T_ANALYSIS_ERROR error;
+    if (!m_doc.RunAnalysis(options, error)) return Refuse(error.text);
+    return SaveCopy(m_doc.Path());
+}
+
+void CUlfIterationDocHost::DispatchEvents()
+{
+    if (m_view) m_view->DispatchEvents();
+}

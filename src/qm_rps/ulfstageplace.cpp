@@ -1,0 +1,53 @@
+#include "qm_rps/ulfstageplace.h"
+
+#include <algorithm>
+
+namespace {
+
+constexpr int kPerStage = kStageStepsMost + 1;
+
+} // namespace
+
+int UlfStageNumber(int stage, int step)
+{
+    return stage * kPerStage + (step == kStageLastStep ? 0 : step);
+}
+
+int StageOfUlfNumber(int number)
+{
+    return number / kPerStage;
+}
+
+int StepOfUlfNumber(int number)
+{
+    const int step = number % kPerStage;
+    return step == 0 ? kStageLastStep : step;
+}
+
+int UlfStepNumber(const T_MODEL& model, int stage, int step)
+{
+    const auto it = model.stages.find(stage);
+    if (it == model.stages.end()) return 0;
+    const int number = StageStepNumber(it->second, step);
+    return number <= kStageStepsMost ? number : 0;
+}
+
+std::vector<int> LoadsActingAt(const T_MODEL& model, int stage, int step)
+{
+    std::vector<int> acting;
+    const int now = UlfStepNumber(model, stage, step);
+    if (now == 0) return acting;
+    const T_STAG_D& record = model.stages.at(stage);
+    const auto reached = [&](const T_STAG_LOAD& load) {
+        const int at = UlfStepNumber(model, stage, load.step);
+        return at != 0 && at <= now;
+    };
+    for (const T_STAG_LOAD& load : record.activate.loads) {
+        const auto& gone = record.deactivate.loads;
+        const bool left = std::any_of(gone.begin(), gone.end(), [&](const T_STAG_LOAD& g) {
+            return g.loadCase == load.loadCase && reached(g);
+        });
+        if (reached(load) && !left) acting.push_back(load.loadCase);
+    }
+    return acting;
+}

@@ -1,0 +1,63 @@
+#include "qm_rps/ulfstageresponse.h"
+
+#include "qm_base/msgfunction.h"
+#include "qm_rps/optrows.h"
+#include "qm_rps/ulfstageplace.h"
+
+#include <algorithm>
+#include <cmath>
+
+using zql::lib::MMSGFunction;
+
+namespace {
+
+constexpr const char* kSumOfAll = "IDS_DB_SGLD_SUM";
+/// Names of the stage loads by load group.
+constexpr std::array<const char*, 2> kSumOfGroup{"IDS_DB_SGLD_DL", "IDS_DB_SGLD_ER"};
+
+bool HasResponse(int group)
+{
+    return group >= kLoadGroupDead && group <= kLoadGroupRest;
+}
+
+} // namespace
+
+int CUlfStageResponse::Select(const T_OPT_ITEM& item, int loadCase, int at)
+{
+    const int stage = StageOfUlfNumber(at);
+    const int step = StepOfUlfNumber(at);
+    const int group = Truncated(item[3]);
+    if (group == kLoadGroupRest) return m_results.SelectCase(loadCase, stage, step);
+    const char* const key =
+        m_sumStageLoads ? kSumOfAll : kSumOfGroup.at(static_cast<std::size_t>(group));
+    return m_results.SelectSum(MMSGFunction::GetValue(key), stage, step);
+}
+
+int CUlfStageResponse::Read(std::span<const T_OPT_ITEM> items, std::span<const T_OPT_QUANTITY> what,
+                            std::span<double> out)
+{
+    m_error.clear();
+    // Quantities of one stage and step together: each selection is made once.
+    std::vector<std::size_t> order(what.size());
+    for (std::size_t q = 0; q < order.size(); ++q)
+        order[q] = q;
+    std::ranges::stable_sort(order, {}, [&](std::size_t q) { return what[q].at; });
+    for (std::size_t i = 0; i < items.size(); ++i) {
+        const bool has = HasResponse(Truncated(items[i][3]));
+        int selected = -1;
+        for (const std::size_t q : order) {
+            double& value = out[q * items.size() + i];
+            value = 0.0;
+            if (!has) continue;
+            const int at = what[q].at != 0 ? what[q].at : Truncated(items[i][0]);
+            const int load = i < m_loads.size() ? m_loads[i] : 0;
+            const bool ok = (at == selected || Select(items[i], load, at)) &&
+                            m_results.ReadOne(what[q], value) && std::isfinite(value);
+            selected = at;
+            if (ok) continue;
+            m_error = m_results.Error();
+            return 0;
+        }
+    }
+    return 1;
+}

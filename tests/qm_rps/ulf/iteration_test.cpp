@@ -1,0 +1,403 @@
+#include "qm_db/filectrl.h"
+#include "qm_rps/ulfiterationdochost.h"
+#include "qm_rps/ulfiterationresultdlg.h"
+#include "qm_rps/ulfstageresults.h"
+#include "qm_rps/unknownloadfactoriteranaldlg.h"
+#include "twotrusses.h"
+
+#include <filesystem>
+#include <gtest/gtest.h>
+
+namespace {
+
+using LINES = std::vector<std::string>;
+
+/// Says what is asked of it; refuses one operation by its name.
+class CScriptedHost : public IUlfIterationHost {
+public:
+    std::string m_path;
+    std::string m_fail;                         // operation to refuse
+    std::vector<std::vector<double>> m_factors; // by solution, of a pretension and another unknown
+    LINES m_log;
+    int m_busy = 2;
+
+    std::string ModelPath() const override { return m_path; }
+    int Solve(std::vector<T_ULF_ITER_ROW>& rows) override
+    {
+        if (!Do("solve" + std::to_string(m_solved))) return 0;
+        const auto& f = m_factors[std::min(m_solved++, m_factors.size() - 1)];
+        rows = {{"S1/First Step", f[0], true}, {"S2/Last Step", f[1], false}};
+        return 1;
+    }
+    int SaveCopy(const std::string& path) override
+    {
+        if (!Do("save " + std::filesystem::path(path).filename().string())) return 0;
+        m_path = path;
+        return 1;
+    }
+    int StartEdit(const std::string& title) override { return Do("start " + title); }
+    int ScalePretension(std::size_t unknown, double factor) override
+    {
+        return Do("scale " + std::to_string(unknown) + " " + std::to_string(factor).substr(0, 4));
+    }
+    int CloseEdit() override { return Do("close"); }
+    void CancelEdit() override { (void)Do("cancel"); }
+    int StartAnalysis() override
+    {
+        m_left = m_busy;
+        return Do("analyse");
+    }
+    bool IsExcuted() override { return m_left > 0; }
+    void DispatchEvents() override
+    {
+        --m_left;
+        (void)Do("dispatch");
+    }
+    bool IsPostMode() override { return Do("post") != 0; }
+
+private:
+    int Do(const std::string& what)
+    {
+        m_log.push_back(what);
+        return m_fail.empty() || what.rfind(m_fail, 0) != 0;
+    }
+    std::size_t m_solved = 0;
+    int m_left = 0;
+};
+
+/// Accepts result dialogs as often as wanted and answers the question about the report.
+class CPerson : public zql::frx::IDialogView {
+public:
+    int m_accept = 99; // dialogs in which iteration is chosen
+    bool m_overwrite = false;
+    LINES m_asked;
+    int m_events = 0;
+    void ShowMessage(const std::string& key, const std::string&) override
+    {
+        m_asked.push_back(key);
+    }
+    bool AskYesNo(const std::string&, const std::string& text) override
+    {
+        m_asked.push_back(text);
+        return m_overwrite;
+    }
+    int RunModal(zql::frx::MDialog& child) override
+    {
+        auto* dialog = dynamic_cast<CUlfIterationResultDlg*>(&child);
+        if (!dialog) return 0;
+        dialog->m_iterate = m_accept-- > 0;
+        return 1;
+    }
+    void DispatchEvents() override { ++m_events; }
+};
+
+class UlfIteration : public testing::Test {
+protected:
+    UlfIteration()
+    {
+        m_folder = testing::TempDir() + "qm_iter_" +
+                   testing::UnitTest::GetInstance()->current_test_info()->name();
+        std::filesystem::remove_all(m_folder);
+        std::filesystem::create_directory(m_folder);
+        m_host.m_path = m_folder + "/frame.ext";
+        m_host.m_factors = {{2.0, 7.0}, {1.0, 7.0}};
+    }
+    int Run(int required = 5, double tolerance = 0.001)
+    {
+        CUlfIteration run(m_host, {required, tolerance});
+        run.SetView(&m_person);
+        run.m_progress = m_progress;
+        const int done = run.Run();
+        m_end = run.End();
+        m_history = run.History();
+        return done;
+    }
+    std::string Report() const
+    {
+        std::string text;
+        T_FILE_ERROR error;
+        return CFileCtrl::ReadWholeFile(m_folder + "/frame.ulf", text, error) ? text : "none";
+    }
+    std::size_t Blocks() const
+    {
+        std::size_t n = 0;
+        const std::string text = Report();
+        for (auto at = text.find("Iteration = "); at != std::string::npos;
+             at = text.find("Iteration = ", at + 1))
+            ++n;
+        return n;
+    }
+
+    std::string m_folder;
+    CScriptedHost m_host;
+    CPerson m_person;
+    std::function<bool(int, int)> m_progress;
+    ULF_ITER_END m_end{};
+    std::vector<T_ULF_ITER_STEP> m_history;
+};
+
+} // namespace
+
+TEST_F(UlfIteration, AsksTheHostInOrderUntilTheFactorsAreOne)
+{
+    EXPECT_EQ(1, Run());
+    EXPECT_EQ(ULF_ITER_END::Converged, m_end);
+    EXPECT_EQ((LINES{"solve0", "save frame_01.ext",
+                     "start Change load values for iterative analysis", "scale 0 2.00",
+                     "scale 1 7.00", "close", "analyse", "dispatch", "dispatch", "post", "solve1"}),
+              m_host.m_log);
+    ASSERT_EQ(2U, m_history.size());
+    EXPECT_EQ(1.0, m_history[0].tolerance); // the other unknown's 7 does not enter
+    EXPECT_EQ(0.0, m_history[1].tolerance);
+    EXPECT_EQ(2U, Blocks());
+}
+
+TEST_F(UlfIteration, WritesTheReportToTheLetter)
+{
+    ASSERT_EQ(1, Run(3, 0.25));
+    const std::string path = m_folder;
+    const std::string rule =
+        "     ======================================================================\n";
+    const std::string frame =
+        "         +============================================================+\n";
+    const std::string report = Report();
+    const std::string settings = rule + "     Required Number of Iterations = 3\n" +
+                                 "     Convergence Tolerance         = 0.250000\n" + rule + "\n\n";
+    const auto block = [&](const char* head, const std::string& file, const char* factor,
+                           const char* tolerance) {
+        return std::string("     Iteration = ") + head + "\n     File Name = " + path + file +
+               "\n" + rule +
+               "        NO                    Stage/Step              FACTOR   PRETENSION\n" +
+               rule + "         1                 S1/First Step             " + factor +
+               "          YES\n" +
+               "         2                  S2/Last Step             7.00000           NO\n" +
+               rule + "     Current Tolerance = " + tolerance + "\n" + rule + "\n\n";
+    };
+    const std::string tail = "\n\n" + settings + block("0", "/frame.ext", "2.00000", "1.000000") +
+                             block("1", "/frame_01.ext", "1.00000", "0.000000");
+    ASSERT_GT(report.size(), tail.size());
+    const std::string head = report.substr(0, report.size() - tail.size());
+    EXPECT_EQ(tail, report.substr(head.size()));
+    EXPECT_EQ(frame, head.substr(0, frame.size()));
+    EXPECT_EQ(frame, head.substr(head.size() - frame.size()));
+    EXPECT_EQ(0U, head.size() % frame.size()); // every line is 72 characters long
+    const std::string title = "         |  QM RPS - Unknown Load Factor               Version ";
+    EXPECT_NE(std::string::npos, head.find(title));
+    EXPECT_NE(std::string::npos, head.find("|  " + std::string(50, ' ') + "QM RPS  |\n"));
+}
+
+TEST_F(UlfIteration, CutsThePlaceToThirtyCharacters)
+{
+    T_ULF_ITER_STEP step{0, "f", {{std::string(28, 'a') + "\xC3\xA9/First Step", 1.0, true}}, 0.0};
+    EXPECT_NE(std::string::npos,
+              UlfIterBlock(step).find("         1" + std::string(28, 'a') +
+                                      "\xC3\xA9/             1.00000          YES\n"));
+}
+
+TEST_F(UlfIteration, MakesNoIterationWhenNoneIsRequired)
+{
+    EXPECT_EQ(1, Run(0));
+    EXPECT_EQ(ULF_ITER_END::Required, m_end);
+    EXPECT_EQ(LINES{"solve0"}, m_host.m_log);
+    EXPECT_EQ(1U, Blocks());
+}
+
+TEST_F(UlfIteration, MakesOneIterationEvenWhenTheFirstFactorsAreOne)
+{
+    m_host.m_factors = {{1.0, 1.0}};
+    EXPECT_EQ(1, Run());
+    EXPECT_EQ(ULF_ITER_END::Converged, m_end);
+    EXPECT_EQ(2U, m_history.size());
+}
+
+TEST_F(UlfIteration, StopsWithinTheToleranceAndNotAboveIt)
+{
+    m_host.m_factors = {{2, 1}, {1.002, 1}, {1.0005, 9}};
+    EXPECT_EQ(1, Run());
+    EXPECT_EQ(ULF_ITER_END::Converged, m_end);
+    ASSERT_EQ(3U, m_history.size());
+    EXPECT_NEAR(0.0005, m_history[2].tolerance, 1e-15);
+    EXPECT_NEAR(0.5, UlfIterTolerance({{"", 1.3, true}, {"", 0.6, true}, {"", 8, false}}), 1e-15);
+}
+
+TEST_F(UlfIteration, DoesTheRequiredNumberWhenItDiverges)
+{
+    m_host.m_factors = {{2, 1}, {3, 1}, {4, 1}, {5, 1}};
+    EXPECT_EQ(1, Run(3));
+    EXPECT_EQ(ULF_ITER_END::Required, m_end);
+    EXPECT_EQ(4U, m_history.size());
+    EXPECT_NE(m_host.m_log.end(),
+              std::find(m_host.m_log.begin(), m_host.m_log.end(), "save frame_03.ext"));
+    EXPECT_EQ("a.b/frame_03", UlfIterCopyPath("a.b/frame.qmdb", 3).substr(0, 12));
+    EXPECT_EQ("frame.v2_12.json", UlfIterCopyPath("frame.v2.json", 12));
+}
+
+TEST_F(UlfIteration, StopsWhereTheHostRefuses)
+{
+    struct T_CASE {
+        const char* fail;
+        ULF_ITER_END end;
+        const char* last; // operation of the log
+        std::size_t blocks;
+    };
+    const T_CASE cases[] = {
+        {"solve0", ULF_ITER_END::NotSolved, "solve0", 0},
+        {"save", ULF_ITER_END::NotSaved, "save frame_01.ext", 1},
+        {"start", ULF_ITER_END::NotScaled, "start Change load values for iterative analysis", 1},
+        {"scale 0", ULF_ITER_END::NotScaled, "cancel", 1},
+        {"scale 1", ULF_ITER_END::NotScaled, "cancel", 1},
+        {"close", ULF_ITER_END::NotScaled, "cancel", 1},
+        {"analyse", ULF_ITER_END::NotAnalysed, "analyse", 1},
+        {"post", ULF_ITER_END::NotAnalysed, "post", 1},
+        {"solve1", ULF_ITER_END::NotSolved, "solve1", 1},
+    };
+    const CScriptedHost fresh;
+    for (const T_CASE& c : cases) {
+        std::filesystem::remove(m_folder + "/frame.ulf");
+        CScriptedHost host;
+        host.m_path = m_folder + "/frame.ext";
+        host.m_factors = {{2.0, 7.0}, {1.0, 7.0}};
+        host.m_fail = c.fail;
+        CUlfIteration run(host, {});
+        run.SetView(&m_person);
+        EXPECT_EQ(0, run.Run()) << c.fail;
+        EXPECT_EQ(c.end, run.End()) << c.fail;
+        EXPECT_EQ(c.last, host.m_log.back()) << c.fail;
+        EXPECT_EQ(c.blocks, Blocks()) << c.fail;
+    }
+}
+
+TEST_F(UlfIteration, GoesOnOnlyWhenThePersonWantsIt)
+{
+    m_person.m_accept = 0;
+    EXPECT_EQ(1, Run());
+    EXPECT_EQ(ULF_ITER_END::Declined, m_end);
+    EXPECT_EQ("none", Report());
+    m_person.m_accept = 2;
+    m_host.m_factors = {{2, 1}};
+    EXPECT_EQ(1, Run());
+    EXPECT_EQ(ULF_ITER_END::Declined, m_end);
+    EXPECT_EQ(3U, m_history.size());
+    EXPECT_EQ(3U, Blocks());
+}
+
+TEST_F(UlfIteration, AsksBeforeAnExistingReportIsOverwritten)
+{
+    const std::string path = m_folder + "/frame.ulf";
+    T_FILE_ERROR error;
+    for (const bool overwrite : {false, true}) {
+        ASSERT_EQ(1, CFileCtrl::WriteWholeFile(path, "old\n", error));
+        m_person.m_overwrite = overwrite;
+        m_person.m_asked.clear();
+        EXPECT_EQ(1, Run(0));
+        EXPECT_EQ(LINES{"The file(" + path + ") already exists, overwrite?\nSelect 'No' to add"},
+                  m_person.m_asked);
+        EXPECT_EQ(!overwrite, Report().rfind("old\n         +=", 0) == 0);
+        EXPECT_EQ(overwrite, Report().rfind("         +=", 0) == 0);
+    }
+    std::filesystem::remove(path);
+    std::filesystem::create_directory(path); // can't be written
+    m_person.m_asked.clear();
+    EXPECT_EQ(0, Run());
+    EXPECT_EQ(ULF_ITER_END::ReportNotWritten, m_end);
+    EXPECT_EQ("IDS_QM_ULF_REPORT_NOT_WRITTEN", m_person.m_asked.back());
+}
+
+TEST_F(UlfIteration, CancelsBetweenIterationsWithEverythingReported)
+{
+    m_host.m_factors = {{2, 1}};
+    m_progress = [](int done, int required) { return required == 5 && done < 2; };
+    EXPECT_EQ(0, Run());
+    EXPECT_EQ(ULF_ITER_END::Cancelled, m_end);
+    EXPECT_EQ("solve2", m_host.m_log.back());
+    EXPECT_EQ(3U, m_history.size());
+    EXPECT_EQ(3U, Blocks());
+}
+
+TEST_F(UlfIteration, BringsATwoTrussFrameToItsTensionInOneIteration)
+{
+    CDBDoc doc;
+    doc.Data().Assign(two::Content());
+    T_FILE_ERROR error;
+    ASSERT_EQ(1, doc.SaveAs(m_folder + "/frame.qmdb", error)) << error.text;
+    T_ANALYSIS_OPTIONS options;
+    options.allCases = false;
+    T_ANALYSIS_ERROR fault;
+    ASSERT_EQ(1, doc.RunAnalysis(options, fault)) << fault.text;
+    CUlfStageResults results(doc);
+    CUnknownStageItemDlg dialog(doc, results, 1);
+    CUlfIterationDocHost host(doc, dialog, &m_person);
+    CUlfIteration run(host, {});
+    dialog.SetView(&m_person);
+    ASSERT_EQ(1, dialog.OnIterate(run)) << host.Error();
+    EXPECT_EQ(ULF_ITER_END::Converged, run.End());
+    ASSERT_EQ(2U, run.History().size());
+    EXPECT_EQ("S1/First Step", run.History()[0].rows.at(0).place);
+    EXPECT_NEAR(4.0, run.History()[0].rows.at(0).factor, 1e-12); // T = 4 holds G
+    EXPECT_NEAR(1.0, run.History()[1].rows.at(0).factor, 1e-12);
+    EXPECT_GT(m_person.m_events, 0);
+    T_DOF6 u{};
+    doc.Post().SelectStage(1, kStageFirstStep, kStageLoadSum);
+    ASSERT_EQ(1, doc.Post().GetDspcNew(2, u));
+    EXPECT_NEAR(0.0, u[0], 1e-12);
+    // The copy on disk has the new tension, the model itself the old one.
+    for (const auto& [name, force] :
+         {std::pair{"/frame.qmdb", 1.0}, std::pair{"/frame_01.qmdb", 4.0}}) {
+        CDBDoc other;
+        ASSERT_EQ(1, other.OpenModel(m_folder + name, OPEN_MODE::ReadOnly, error)) << error.text;
+        EXPECT_NEAR(force, other.Data().Model().loadCases.at(2).pretension.at(0).force, 1e-12);
+    }
+    // One command of the person takes the change back.
+    EXPECT_EQ("Change load values for iterative analysis", doc.Undo().UndoTitle());
+    ASSERT_EQ(1, doc.Undo().Undo());
+    EXPECT_EQ(1.0, doc.Data().Model().loadCases.at(2).pretension.at(0).force);
+}
+
+TEST_F(UlfIteration, LeavesTheLoadsWhenOneOfThemCannotBeChanged)
+{
+    T_MODEL_CONTENT content = two::Content();
+    content.model.loadCases[2].pretension.push_back({9, 1.0}); // there is no such element
+    CDBDoc doc;
+    doc.Data().Assign(std::move(content));
+    CUlfStageResults results(doc);
+    CUnknownStageItemDlg dialog(doc, results, 1);
+    CUlfIterationDocHost host(doc, dialog, nullptr);
+    (void)dialog.OnCalculate(); // forms the problem; without results there are no factors
+    ASSERT_EQ(1, host.StartEdit("scale"));
+    EXPECT_EQ(0, host.ScalePretension(0, 2.0));
+    EXPECT_NE(std::string::npos, host.Error().find('9'));
+    host.CancelEdit();
+    EXPECT_EQ(1.0, doc.Data().Model().loadCases.at(2).pretension.at(0).force);
+    EXPECT_FALSE(doc.Undo().CanUndo());
+}
+
+TEST(UlfIterationSettings, StayWithTheDocumentUnderTheirKey)
+{
+    CDBDoc doc;
+    EXPECT_EQ(nullptr, doc.DynModules().GetDynModule("43ABD68B_707D_010A_77B6_2AA6BE4C"));
+    CUnknownLoadFactorIterAnal* settings = CUnknownLoadFactorIterAnal::Of(doc.DynModules());
+    ASSERT_NE(nullptr, settings);
+    EXPECT_EQ(5, settings->Settings().required);
+    EXPECT_EQ(0.001, settings->Settings().tolerance);
+    EXPECT_EQ(settings, doc.DynModules().GetDynModule("43ABD68B_707D_010A_77B6_2AA6BE4C"));
+
+    CUnknownLoadFactorIterAnalDlg dialog(*settings);
+    EXPECT_EQ("5", dialog.m_required);
+    EXPECT_EQ("0.001", dialog.m_tolerance);
+    dialog.OnSpin(1);
+    dialog.m_tolerance = "1e-6";
+    EXPECT_EQ(1, dialog.OnOK());
+    EXPECT_EQ((T_ULF_ITER_SETTINGS{6, 1e-6}),
+              CUnknownLoadFactorIterAnal::Of(doc.DynModules())->Settings());
+    for (const auto& [required, tolerance] :
+         {std::pair{"-1", "1"}, {"100", "1"}, {"2.5", "1"}, {"2", "-1"}, {"2", "nan"}, {"", "1"}}) {
+        dialog.m_required = required;
+        dialog.m_tolerance = tolerance;
+        EXPECT_EQ(0, dialog.OnOK()) << required << ' ' << tolerance;
+    }
+    EXPECT_EQ(6U, dialog.Messages().size());
+    EXPECT_EQ(6, settings->Settings().required);
+    dialog.m_required = "0";
+    dialog.OnSpin(-1);
+    EXPECT_EQ("0", dialog.m_required);
+}
