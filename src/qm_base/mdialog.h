@@ -39,6 +39,7 @@ public:
 
     /// The view is not owned and must outlive the dialog or be reset to null.
     void SetView(IDialogView* view) { m_view = view; }
+    IDialogView* View() const { return m_view; }
 
     /// Every message shown so far, oldest first.
     const std::vector<T_MESSAGE>& Messages() const { return m_messages; }
@@ -59,7 +60,6 @@ protected:
     /// Asks the person; without a view the answer is no (nothing is guessed).
     bool AskYesNo(const std::string& key);
     bool AskYesNo(const std::string& key, const std::string& text);
-    IDialogView* View() const { return m_view; }
 
 private:
     IDialogView* m_view = nullptr;

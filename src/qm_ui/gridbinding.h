@@ -1,0 +1,37 @@
+// What a table of a view is bound to: rows and columns of texts of a dialog model.
+#pragma once
+
+#include "qm_rps/hingenumbergrid.h"
+#include "qm_ui/binding.h"
+
+/// How a column shows and takes its cells. Numbers: the model's text has '.', the table the
+/// locale's separator. Flags: "1" and "0", shown as a check box.
+enum class CELL_KIND { Text, Number, Flag, Choice };
+
+struct T_GRID_COLUMN {
+    TextFn head;
+    CELL_KIND kind = CELL_KIND::Text;
+    bool edit = false;
+    std::function<std::vector<std::string>()> choices{}; // of a Choice
+};
+
+struct T_GRID_BINDING {
+    std::vector<T_GRID_COLUMN> columns{};
+    std::function<std::size_t()> rows{};
+    std::function<std::string(std::size_t row, std::size_t column)> text{};
+    /// Takes an edited cell: 1 taken, 0 refused (the cell shows its old value again). A choice
+    /// gives its text.
+    std::function<int(std::size_t row, std::size_t column, const std::string&)> set{};
+    std::function<std::string(std::size_t row)> rowHead{}; // empty: numbers from 1
+    /// Takes a copied block, whole or not at all, and says why not. Empty: the view gives the
+    /// cells to `set` one by one; those that are refused keep their values.
+    std::function<int(const std::string& text, const T_GRID_RANGE& range)> paste{};
+    /// The chosen row, as it changes; -1 none.
+    std::function<void(int row)> select{};
+    std::function<int()> selected{};             // the model's choice, shown with each refresh
+    std::function<void(std::size_t row)> open{}; // double click, or Enter on a fixed cell
+    std::function<std::string(std::size_t row, std::size_t column)> mark{}; // finding of a cell
+};
+
+/// The whole of a number grid of the models. The grid must outlive the view.
+T_GRID_BINDING GridOf(CHingeNumberGrid& grid);
