@@ -1,18 +1,10 @@
 #include "inputfile.h"
 
-#include <array>
 #include <cstdio>
-#include <fstream>
-#include <string_view>
 
 bool IsModelFile(const std::string& path)
 {
-    if (path.ends_with(".qmdb")) return true;
-    constexpr std::string_view kMagic = "SQLite format 3";
-    std::array<char, kMagic.size()> head{};
-    std::ifstream file(path, std::ios::binary);
-    file.read(head.data(), head.size());
-    return file && std::string_view(head.data(), head.size()) == kMagic;
+    return CModelStore::IsModelFile(path);
 }
 
 EXIT_CODE ReportFileError(const T_FILE_ERROR& error)

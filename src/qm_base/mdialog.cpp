@@ -30,4 +30,9 @@ bool MDialog::AskYesNo(const std::string& key, const std::string& text)
     return m_view && m_view->AskYesNo(key, text);
 }
 
+ANSWER MDialog::AskYesNoCancel(const std::string& key, const std::string& text)
+{
+    return m_view ? m_view->AskYesNoCancel(key, text) : ANSWER::Cancel;
+}
+
 } // namespace zql::frx

@@ -8,6 +8,8 @@ namespace zql::frx {
 
 class MDialog;
 
+enum class ANSWER { Yes, No, Cancel };
+
 /// What stands between a dialog model and the person: a window, a script of answers, or stderr.
 class IDialogView {
 public:
@@ -17,6 +19,11 @@ public:
     virtual ~IDialogView() = default;
     virtual void ShowMessage(const std::string& key, const std::string& text) = 0;
     virtual bool AskYesNo(const std::string& key, const std::string& text) = 0;
+    /// A view that offers no third answer takes a no for a cancel: nothing is lost by it.
+    virtual ANSWER AskYesNoCancel(const std::string& key, const std::string& text)
+    {
+        return AskYesNo(key, text) ? ANSWER::Yes : ANSWER::Cancel;
+    }
     /// Shows a child dialog; 1 accepted, 0 cancelled.
     virtual int RunModal(MDialog& child) = 0;
     /// Handles what has come in while a long operation runs, except closing the window and system
@@ -60,6 +67,7 @@ protected:
     /// Asks the person; without a view the answer is no (nothing is guessed).
     bool AskYesNo(const std::string& key);
     bool AskYesNo(const std::string& key, const std::string& text);
+    ANSWER AskYesNoCancel(const std::string& key, const std::string& text);
 
 private:
     IDialogView* m_view = nullptr;

@@ -42,6 +42,12 @@ void CDBDoc::Reset(T_MODEL_CONTENT content, const std::string& path)
     m_path = path;
 }
 
+void CDBDoc::NewModel()
+{
+    m_store.Close();
+    Reset({}, {});
+}
+
 int CDBDoc::OpenModel(const std::string& path, OPEN_MODE mode, T_FILE_ERROR& error)
 {
     T_MODEL_CONTENT content;

@@ -37,6 +37,8 @@ public:
     CEditData& Edit() { return m_edit; }
     CDynModuleMgr& DynModules() { return m_modules; }
 
+    /// An empty model without a path.
+    void NewModel();
     /// Opens a model file (see CModelStore::Open) or reads a case file. 1 done; 0 error filled
     /// and the document as it was.
     [[nodiscard]] int OpenModel(const std::string& path, OPEN_MODE mode, T_FILE_ERROR& error);

@@ -7,6 +7,7 @@
 
 #include <cerrno>
 #include <filesystem>
+#include <fstream>
 #include <unistd.h>
 
 namespace fs = std::filesystem;
@@ -87,6 +88,16 @@ int CModelStore::CheckWhole(const std::string& path, T_FILE_ERROR& error)
 {
     return Guarded(path, error,
                    [&] { (void)ReadModelFile(path, CurrentSchema(), CHECK_DEPTH::Whole); });
+}
+
+bool CModelStore::IsModelFile(const std::string& path)
+{
+    if (path.ends_with(".qmdb")) return true;
+    constexpr std::string_view kMagic = "SQLite format 3";
+    std::array<char, kMagic.size()> head{};
+    std::ifstream file(path, std::ios::binary);
+    file.read(head.data(), head.size());
+    return file && std::string_view(head.data(), head.size()) == kMagic;
 }
 
 void CModelStore::Close()

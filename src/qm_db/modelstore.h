@@ -50,6 +50,9 @@ public:
     /// Reads every table and block and checks every checksum. 1 all well; 0 error filled.
     [[nodiscard]] static int CheckWhole(const std::string& path, T_FILE_ERROR& error);
 
+    /// Whether a path is that of a model file, by its extension or else by how its content begins.
+    [[nodiscard]] static bool IsModelFile(const std::string& path);
+
     /// Gives up the writer's lock, if held.
     void Close();
 

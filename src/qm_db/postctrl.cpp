@@ -251,32 +251,39 @@ std::optional<double> CPostCtrl::StoreyMean(const T_STOR_D& storey, std::size_t 
     return byMass && weight > 0.0 ? sum / weight : plain / count;
 }
 
-int CPostCtrl::GetPushoverStoryDriftRatio(int loadCase, int step, double& kind1, double& kind2)
+int CPostCtrl::GetPushoverStoryDrifts(int loadCase, int step, std::vector<T_STOREY_DRIFT>& out)
 {
     const auto& storeys = m_data.Model().storeys;
     m_error.clear();
     if (storeys.empty() || !SelectPushover(loadCase) || !SelectStep(step)) return 0;
     const auto index = static_cast<std::size_t>(step - 1);
-    std::array<double, 2> below{}, largest{};
+    std::vector<T_STOREY_DRIFT> drifts;
+    double plainBelow = 0.0, centreBelow = 0.0;
     double height = 0.0; // from the last level that is known
-    bool known = false;
-    for (const auto& entry : storeys) {
-        const T_STOR_D& storey = entry.second;
+    for (const auto& [key, storey] : storeys) {
         height += FromSi(storey.height, m_data.Units(), kDimLength);
         const auto plain = StoreyMean(storey, index, false, Direction());
         const auto centre = StoreyMean(storey, index, true, Direction());
         if (!plain || !centre || !(height > 0.0)) continue;
-        const std::array<double, 2> u{*plain, *centre};
-        for (std::size_t k = 0; k < 2; ++k) {
-            largest[k] = std::max(largest[k], std::fabs(u[k] - below[k]) / height);
-            below[k] = u[k];
-        }
+        drifts.push_back({key, (*plain - plainBelow) / height, (*centre - centreBelow) / height});
+        plainBelow = *plain;
+        centreBelow = *centre;
         height = 0.0;
-        known = true;
     }
-    if (!m_error.empty() || !known) return 0;
-    kind1 = largest[0];
-    kind2 = largest[1];
+    if (!m_error.empty() || drifts.empty()) return 0;
+    out = std::move(drifts);
+    return 1;
+}
+
+int CPostCtrl::GetPushoverStoryDriftRatio(int loadCase, int step, double& kind1, double& kind2)
+{
+    std::vector<T_STOREY_DRIFT> drifts;
+    if (!GetPushoverStoryDrifts(loadCase, step, drifts)) return 0;
+    kind1 = kind2 = 0.0;
+    for (const T_STOREY_DRIFT& drift : drifts) {
+        kind1 = std::max(kind1, std::fabs(drift.plain));
+        kind2 = std::max(kind2, std::fabs(drift.centre));
+    }
     return 1;
 }
 

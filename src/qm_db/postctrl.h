@@ -17,6 +17,13 @@ struct T_MPAM_D {
     T_DOF6 percent{};
 };
 
+/// Drift ratios of a storey, or of several of which only the top one has results.
+struct T_STOREY_DRIFT {
+    int storey = 0;      // key of the level at the top
+    double plain = 0.0;  // by the mean over the level's nodes
+    double centre = 0.0; // at the level's centre of mass
+};
+
 /// Limit-state steps of the pushover load cases, kept with the model.
 class CPoverInfo {
 public:
@@ -113,6 +120,10 @@ public:
     /// storeys or no results, outputs as they were.
     [[nodiscard]] int GetPushoverStoryDriftRatio(int loadCase, int step, double& kind1,
                                                  double& kind2);
+
+    /// The same by storey, bottom to top, with signs.
+    [[nodiscard]] int GetPushoverStoryDrifts(int loadCase, int step,
+                                             std::vector<T_STOREY_DRIFT>& out);
 
     /// True when some storeys have nodes with results and others none: drifts then span several
     /// storeys.

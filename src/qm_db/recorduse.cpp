@@ -29,12 +29,12 @@ bool Contains(const std::vector<int>& ids, int id)
 constexpr int kStaticPattern = 0; // kind of a pushover pattern that names a static load case
 
 // By RECORD_KIND.
-constexpr std::array<const char*, 13> kKindKeys{
+constexpr std::array<const char*, 14> kKindKeys{
     "IDS_QM_DB_USER_ELEMENT",       "IDS_QM_DB_USER_DIAPHRAGM",      "IDS_QM_DB_USER_EQUAL",
     "IDS_QM_DB_USER_LOAD_CASE",     "IDS_QM_DB_USER_LCOM",           "IDS_QM_DB_USER_ULF_ITEM",
     "IDS_QM_DB_USER_STOREY",        "IDS_QM_DB_USER_HINGE",          "IDS_QM_DB_USER_HINGE_TYPE",
     "IDS_QM_DB_USER_PUSHOVER",      "IDS_QM_DB_USER_ULF_CONSTRAINT", "IDS_QM_DB_USER_STAGE",
-    "IDS_QM_DB_USER_ULF_STAGE_ITEM"};
+    "IDS_QM_DB_USER_ULF_STAGE_ITEM", "IDS_QM_DB_USER_EVALUATION"};
 
 /// Adds the stages of which a part, what comes or what goes, fulfils `uses`.
 template <class F>
@@ -168,6 +168,49 @@ T_RECORD_USERS UsersOf<T_PHGT_D>(const T_MODEL& model, int key)
     return users;
 }
 
+/// Name of a record that is there.
+template <class T>
+std::string NameOfKey(const T_TABLE<T>& table, int key)
+{
+    const auto it = table.find(key);
+    return it == table.end() ? std::string() : it->second.name;
+}
+
+template <>
+T_RECORD_USERS UsersOf<T_SPFC_D>(const T_MODEL& model, int key)
+{
+    T_RECORD_USERS users;
+    Collect(model.evaluations, RECORD_KIND::Evaluation, users,
+            [name = NameOfKey(model.spectra, key)](const T_EVAL_D& e) {
+                return e.spectrum == name;
+            });
+    return users;
+}
+
+template <>
+T_RECORD_USERS UsersOf<T_POLC_D>(const T_MODEL& model, int key)
+{
+    T_RECORD_USERS users;
+    Collect(model.evaluations, RECORD_KIND::Evaluation, users,
+            [name = NameOfKey(model.pushovers, key)](const T_EVAL_D& e) {
+                return e.push == name;
+            });
+    return users;
+}
+
+template <>
+T_RECORD_USERS UsersOf<T_ULFC_D>(const T_MODEL& model, int key)
+{
+    T_RECORD_USERS users;
+    const auto names = [name = NameOfKey(model.ulfConstraints, key)](const auto& item) {
+        return std::find(item.constraints.begin(), item.constraints.end(), name) !=
+               item.constraints.end();
+    };
+    Collect(model.ulfItems, RECORD_KIND::UlfItem, users, names);
+    Collect(model.ulfStageItems, RECORD_KIND::UlfStageItem, users, names);
+    return users;
+}
+
 std::string DescribeUser(const T_MODEL& model, const T_RECORD_USER& user)
 {
     std::string which = std::to_string(user.key);
@@ -180,5 +223,6 @@ std::string DescribeUser(const T_MODEL& model, const T_RECORD_USER& user)
     if (user.kind == RECORD_KIND::UlfConstraint) which = Quoted(model.ulfConstraints, user.key);
     if (user.kind == RECORD_KIND::Stage) which = Quoted(model.stages, user.key);
     if (user.kind == RECORD_KIND::UlfStageItem) which = Quoted(model.ulfStageItems, user.key);
+    if (user.kind == RECORD_KIND::Evaluation) which = Quoted(model.evaluations, user.key);
     return zql::lib::MMSGFunction::Format(kKindKeys[static_cast<std::size_t>(user.kind)], {which});
 }

@@ -19,7 +19,8 @@ enum class RECORD_KIND {
     Pushover,
     UlfConstraint,
     Stage,
-    UlfStageItem
+    UlfStageItem,
+    Evaluation
 };
 
 struct T_RECORD_USER {
@@ -52,6 +53,14 @@ template <>
 T_RECORD_USERS UsersOf<T_STAG_D>(const T_MODEL& model, int key);
 template <>
 T_RECORD_USERS UsersOf<T_PHGT_D>(const T_MODEL& model, int key);
+
+/// Evaluations name their spectrum and load case, items their constraints.
+template <>
+T_RECORD_USERS UsersOf<T_SPFC_D>(const T_MODEL& model, int key);
+template <>
+T_RECORD_USERS UsersOf<T_POLC_D>(const T_MODEL& model, int key);
+template <>
+T_RECORD_USERS UsersOf<T_ULFC_D>(const T_MODEL& model, int key);
 
 /// "element 4"; "combination \"C1\"" for what has a name.
 std::string DescribeUser(const T_MODEL& model, const T_RECORD_USER& user);

@@ -2,15 +2,11 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
+#include "qm_rps/gridblock.h"
 
 #include <cstddef>
 #include <string>
 #include <vector>
-
-/// Selected cells; a single cell is where a pasted block starts.
-struct T_GRID_RANGE {
-    std::size_t row = 0, column = 0, rows = 1, columns = 1;
-};
 
 /// Base of the grids of interaction points. The numbers stay in the record of the dialog, which
 /// must outlive the grid.

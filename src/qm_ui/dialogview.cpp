@@ -6,7 +6,7 @@
 
 #include <QCoreApplication>
 #include <QEvent>
-#include <QMessageBox>
+#include <QPushButton>
 
 using zql::lib::MMSGFunction;
 
@@ -47,13 +47,35 @@ void CDialogView::ShowMessage(const std::string&, const std::string& text)
     box.exec();
 }
 
+int CDialogView::Ask(const std::string& text, QMessageBox::StandardButtons buttons,
+                     QMessageBox::StandardButton preset)
+{
+    QMessageBox box(QMessageBox::Question, Product(), QString::fromStdString(text), buttons,
+                    m_parent);
+    box.setTextFormat(Qt::PlainText);
+    box.setDefaultButton(preset);
+    const std::pair<QMessageBox::StandardButton, const char*> names[] = {
+        {QMessageBox::Yes, "IDS_QM_UI_YES"},
+        {QMessageBox::No, "IDS_QM_UI_NO"},
+        {QMessageBox::Cancel, "IDS_QM_UI_CANCEL"}};
+    for (const auto& [which, key] : names)
+        if (QAbstractButton* button = box.button(which))
+            button->setText(QString::fromStdString(MMSGFunction::GetValue(key)));
+    return box.exec();
+}
+
 bool CDialogView::AskYesNo(const std::string&, const std::string& text)
 {
-    QMessageBox box(QMessageBox::Question, Product(), QString::fromStdString(text),
-                    QMessageBox::Yes | QMessageBox::No, m_parent);
-    box.setTextFormat(Qt::PlainText);
-    box.setDefaultButton(QMessageBox::No);
-    return box.exec() == QMessageBox::Yes;
+    return Ask(text, QMessageBox::Yes | QMessageBox::No, QMessageBox::No) == QMessageBox::Yes;
+}
+
+zql::frx::ANSWER CDialogView::AskYesNoCancel(const std::string&, const std::string& text)
+{
+    const int answer =
+        Ask(text, QMessageBox::Yes | QMessageBox::No | QMessageBox::Cancel, QMessageBox::Yes);
+    return answer == QMessageBox::Yes  ? zql::frx::ANSWER::Yes
+           : answer == QMessageBox::No ? zql::frx::ANSWER::No
+                                       : zql::frx::ANSWER::Cancel;
 }
 
 int CDialogView::RunModal(zql::frx::MDialog& child)

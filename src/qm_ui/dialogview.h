@@ -3,6 +3,7 @@
 
 #include "qm_ui/viewfactory.h"
 
+#include <QMessageBox>
 #include <QPointer>
 
 /// Boxes and child windows stand over `parent`. Every message also goes to the message history.
@@ -13,6 +14,7 @@ public:
 
     void ShowMessage(const std::string& key, const std::string& text) override;
     bool AskYesNo(const std::string& key, const std::string& text) override;
+    zql::frx::ANSWER AskYesNoCancel(const std::string& key, const std::string& text) override;
     /// Shows the model's window until it is closed; the model's own view is that window meanwhile.
     /// 0 also for a model that no view is registered for (said in a message).
     int RunModal(zql::frx::MDialog& child) override;
@@ -22,6 +24,9 @@ public:
     const CViewFactory& Factory() const { return m_factory; }
 
 private:
+    int Ask(const std::string& text, QMessageBox::StandardButtons buttons,
+            QMessageBox::StandardButton preset);
+
     const CViewFactory& m_factory;
     QPointer<QWidget> m_parent;
 };

@@ -2,11 +2,8 @@
 #pragma once
 
 #include "qm_rps/hingenumbergrid.h"
+#include "qm_rps/recordgrid.h"
 #include "qm_ui/binding.h"
-
-/// How a column shows and takes its cells. Numbers: the model's text has '.', the table the
-/// locale's separator. Flags: "1" and "0", shown as a check box.
-enum class CELL_KIND { Text, Number, Flag, Choice };
 
 struct T_GRID_COLUMN {
     TextFn head;
@@ -33,5 +30,7 @@ struct T_GRID_BINDING {
     std::function<std::string(std::size_t row, std::size_t column)> mark{}; // finding of a cell
 };
 
+/// The whole of a table of records. It must outlive the view.
+T_GRID_BINDING GridOf(CRecordGrid& grid);
 /// The whole of a number grid of the models. The grid must outlive the view.
 T_GRID_BINDING GridOf(CHingeNumberGrid& grid);

@@ -1,0 +1,28 @@
+#include "mainwindow.h"
+
+#include <QApplication>
+#include <QCommandLineParser>
+
+#include <clocale>
+
+int main(int argc, char** argv)
+{
+    QApplication app(argc, argv);
+    std::setlocale(LC_NUMERIC, "C"); // models write '.', whatever the locale of the windows is
+    QCoreApplication::setOrganizationName("qm-rps");
+    QCoreApplication::setApplicationName("qm-rps-desktop");
+    QCoreApplication::setApplicationVersion(QM_RPS_VERSION);
+    QCommandLineParser parser;
+    parser.setApplicationDescription(
+        "Pushover evaluation, plastic hinges and unknown load factors");
+    parser.addHelpOption();
+    parser.addVersionOption();
+    parser.addPositionalArgument("model", "Model file (.qmdb) or case file (.json) to open.",
+                                 "[model]");
+    parser.process(app);
+    CMainWindow window;
+    window.show();
+    if (!parser.positionalArguments().isEmpty())
+        (void)window.Open(parser.positionalArguments().first());
+    return QApplication::exec();
+}

@@ -1,0 +1,343 @@
+#include "mainwindow.h"
+
+#include "explorerpane.h"
+#include "toolcommands.h"
+
+#include "qm_base/messagehistory.h"
+#include "qm_base/msgfunction.h"
+#include "qm_ui/printing.h"
+
+#include <QAction>
+#include <QApplication>
+#include <QCloseEvent>
+#include <QDockWidget>
+#include <QFileInfo>
+#include <QLabel>
+#include <QMenuBar>
+#include <QPlainTextEdit>
+#include <QSettings>
+#include <QStatusBar>
+#include <QToolBar>
+
+#include <map>
+
+using zql::lib::MMSGFunction;
+
+namespace {
+
+constexpr int kMostRecent = 8;
+constexpr const char* kRecentKey = "recent";
+constexpr const char* kLanguageKey = "language";
+
+QString Text(const char* key)
+{
+    return QString::fromStdString(MMSGFunction::GetValue(key));
+}
+
+} // namespace
+
+CMainWindow::CMainWindow()
+    : m_desktop{m_doc, m_frame, m_factory, m_view, this, [this] { Refresh(); }}
+{
+    RegisterViews(m_factory);
+    m_frame.SetView(&m_view);
+    m_frame.m_askPath = [this] { return AskSavePath().toStdString(); };
+    const QString language = QSettings().value(kLanguageKey, "en").toString();
+    (void)MMSGFunction::SetLanguage(language.toStdString());
+    MakePanes();
+    MakeMenus();
+    SetMessageHistorySink([this](std::string_view line) {
+        m_messages->appendPlainText(
+            QString::fromUtf8(line.data(), static_cast<qsizetype>(line.size())));
+    });
+    m_explorer->m_open = [this](EXPLORER_TABLE table, int key) {
+        OpenRecord(m_desktop, table, key);
+        Refresh();
+    };
+    ShowTexts();
+    Refresh();
+    resize(1280, 800);
+}
+
+CMainWindow::~CMainWindow()
+{
+    SetMessageHistorySink({});
+}
+
+// ---- panes and menus ----------------------------------------------------------------------------
+
+void CMainWindow::MakePanes()
+{
+    m_framePane = new CFramePane(m_scene, this);
+    setCentralWidget(m_framePane);
+    m_explorer = new CExplorerPane(
+        m_doc, m_view, [this] { Refresh(); }, this);
+    m_messages = new QPlainTextEdit(this);
+    m_messages->setReadOnly(true);
+    m_messages->setMaximumBlockCount(1000);
+    const auto dock = [this](QWidget* pane, const char* name, Qt::DockWidgetArea area) {
+        auto* widget = new QDockWidget(this);
+        widget->setObjectName(QLatin1String(name));
+        widget->setWidget(pane);
+        addDockWidget(area, widget);
+        return widget;
+    };
+    QDockWidget* left = dock(m_explorer, "IDS_QM_UI_EXPLORER", Qt::LeftDockWidgetArea);
+    QDockWidget* below = dock(m_messages, "IDS_QM_UI_MESSAGES", Qt::BottomDockWidgetArea);
+    setCorner(Qt::BottomLeftCorner, Qt::LeftDockWidgetArea);
+    resizeDocks({left}, {430}, Qt::Horizontal);
+    resizeDocks({below}, {110}, Qt::Vertical);
+    m_units = new QLabel(this);
+    statusBar()->addPermanentWidget(m_units);
+}
+
+void CMainWindow::MakeMenus()
+{
+    for (const T_COMMANDS& part : {FileCommands(), EditCommands(), ViewCommands(),
+                                   ToolCommands(m_desktop), WindowCommands()})
+        m_commands.insert(m_commands.end(), part.begin(), part.end());
+    std::map<std::string, QMenu*> menus;
+    for (std::size_t i = 0; i < m_commands.size(); ++i) {
+        const T_COMMAND& command = m_commands[i];
+        QMenu*& menu = menus[command.menu];
+        if (!menu) {
+            menu = menuBar()->addMenu(QString());
+            m_menus.emplace_back(menu, command.menu);
+            connect(menu, &QMenu::aboutToShow, this, [this] { UpdateActions(); });
+        }
+        if (!*command.key) {
+            menu->addSeparator();
+            continue;
+        }
+        QAction* action = menu->addAction(QString());
+        action->setShortcut(QKeySequence(QLatin1String(command.keys)));
+        action->setCheckable(command.checked != nullptr);
+        connect(action, &QAction::triggered, this, [this, i] {
+            m_commands[i].run();
+            UpdateActions();
+        });
+        m_actions.emplace_back(action, i);
+        if (std::string_view(command.key) == "IDS_QM_UI_OPEN") {
+            m_recent = menu->addMenu(QString());
+            connect(m_recent, &QMenu::aboutToShow, this, [this] { ShowRecent(); });
+        }
+    }
+    ShowRecent();
+}
+
+QAction* CMainWindow::Action(const char* key) const
+{
+    for (const auto& [action, i] : m_actions)
+        if (std::string_view(m_commands[i].key) == key) return action;
+    return nullptr;
+}
+
+QString CMainWindow::Messages() const
+{
+    return m_messages->toPlainText();
+}
+
+void CMainWindow::ShowTexts()
+{
+    for (const auto& [menu, key] : m_menus)
+        menu->setTitle(Text(key));
+    for (const auto& [action, i] : m_actions)
+        action->setText(Text(m_commands[i].key));
+    if (m_recent) m_recent->setTitle(Text("IDS_QM_UI_RECENT"));
+    for (QDockWidget* dock : findChildren<QDockWidget*>())
+        dock->setWindowTitle(Text(dock->objectName().toLatin1().constData()));
+    m_explorer->Retranslate();
+    m_framePane->Retranslate();
+}
+
+void CMainWindow::UpdateActions()
+{
+    for (const auto& [action, i] : m_actions) {
+        const T_COMMAND& command = m_commands[i];
+        action->setEnabled(!command.enabled || command.enabled());
+        if (command.checked) action->setChecked(command.checked());
+    }
+}
+
+void CMainWindow::Refresh()
+{
+    m_explorer->Refresh();
+    m_framePane->Refresh();
+    const T_UNITS units = m_doc.Unit().Units();
+    const auto force = QString::fromStdString(std::string(NameOf(units.force)));
+    const auto length = QString::fromStdString(std::string(NameOf(units.length)));
+    m_units->setText(QStringLiteral("%1, %2, s").arg(force, length));
+    setWindowTitle(QString::fromStdString(m_frame.Title()) + " - " + Text("IDS_QM_PRODUCT"));
+    UpdateActions();
+}
+
+void CMainWindow::SetLanguage(const std::string& code)
+{
+    if (!MMSGFunction::SetLanguage(code)) return;
+    QSettings().setValue(kLanguageKey, QString::fromStdString(code));
+    ShowTexts();
+    for (QWidget* widget : QApplication::allWidgets()) {
+        QEvent event(QEvent::LanguageChange);
+        QApplication::sendEvent(widget, &event);
+    }
+    Refresh();
+}
+
+// ---- commands -----------------------------------------------------------------------------------
+
+T_COMMANDS CMainWindow::FileCommands()
+{
+    constexpr const char* kMenu = "IDS_QM_UI_MENU_FILE";
+    const auto open = [this] {
+        const QString path =
+            AskFileName(this, false, Text("IDS_QM_UI_OPEN_TITLE"), Text("IDS_QM_UI_OPEN_FILTER"));
+        if (!path.isEmpty()) (void)Open(path);
+    };
+    const auto make = [this] {
+        if (m_frame.OnNew()) Refresh();
+    };
+    const auto save = [this] {
+        if (m_frame.SavePath().empty()) return SaveAs();
+        (void)m_frame.OnSave();
+        Refresh();
+    };
+    const auto exportCase = [this] {
+        const QString path = AskFileName(this, true, Text("IDS_QM_UI_EXPORT_CASE_TITLE"),
+                                         Text("IDS_QM_UI_CASE_FILTER"));
+        if (!path.isEmpty()) (void)m_frame.OnExportCase(path.toStdString());
+    };
+    return {{kMenu, "IDS_QM_UI_NEW", "Ctrl+N", make},
+            {kMenu, "IDS_QM_UI_OPEN", "Ctrl+O", open},
+            {kMenu, "IDS_QM_UI_SAVE", "Ctrl+S", save},
+            {kMenu, "IDS_QM_UI_SAVE_AS", "Ctrl+Shift+S", [this] { SaveAs(); }},
+            {kMenu, "IDS_QM_UI_EXPORT_CASE", "", exportCase},
+            {kMenu},
+            {kMenu, "IDS_QM_UI_EXPORT_PICTURE", "Ctrl+E", [this] { ExportPicture(); }},
+            {kMenu, "IDS_QM_UI_PRINT", "Ctrl+P",
+             [this] { (void)PrintDrawing(this, m_framePane->Drawing()); }},
+            {kMenu},
+            {kMenu, "IDS_QM_UI_EXIT", "Ctrl+Q", [this] { close(); }}};
+}
+
+T_COMMANDS CMainWindow::EditCommands()
+{
+    constexpr const char* kMenu = "IDS_QM_UI_MENU_EDIT";
+    const auto undo = [this] {
+        if (m_frame.OnUndo()) Refresh();
+    };
+    const auto redo = [this] {
+        if (m_frame.OnRedo()) Refresh();
+    };
+    return {{kMenu, "IDS_QM_UI_UNDO", "Ctrl+Z", undo, [this] { return m_doc.Undo().CanUndo(); }},
+            {kMenu, "IDS_QM_UI_REDO", "Ctrl+Y", redo, [this] { return m_doc.Undo().CanRedo(); }},
+            {kMenu},
+            {kMenu, "IDS_QM_UI_ADD_RECORD", "Ctrl+Ins", [this] { m_explorer->Add(); }},
+            {kMenu, "IDS_QM_UI_DELETE_RECORD", "Ctrl+Del", [this] { m_explorer->Delete(); }}};
+}
+
+T_COMMANDS CMainWindow::ViewCommands()
+{
+    constexpr const char* kMenu = "IDS_QM_UI_MENU_VIEW";
+    const auto look = [this](const T_CAMERA& camera) {
+        return [this, camera] { m_framePane->View().SetCamera(camera); };
+    };
+    const auto flag = [this, kMenu](const char* key, const char* keys,
+                                    bool T_FRAME_OPTIONS::*which) {
+        return T_COMMAND{kMenu,
+                         key,
+                         keys,
+                         [this, which] {
+                             T_FRAME_OPTIONS options = m_framePane->View().Options();
+                             options.*which = !(options.*which);
+                             m_framePane->View().SetOptions(options);
+                         },
+                         {},
+                         [this, which] { return m_framePane->View().Options().*which; }};
+    };
+    using O = T_FRAME_OPTIONS;
+    return {{kMenu, "IDS_QM_UI_VIEW_ISO", "Alt+1", look(kIsometric)},
+            {kMenu, "IDS_QM_UI_VIEW_XZ", "Alt+2", look(kElevationXZ)},
+            {kMenu, "IDS_QM_UI_VIEW_YZ", "Alt+3", look(kElevationYZ)},
+            {kMenu, "IDS_QM_UI_VIEW_XY", "Alt+4", look(kPlanXY)},
+            {kMenu},
+            flag("IDS_QM_UI_VIEW_NODES", "Alt+N", &O::nodeNumbers),
+            flag("IDS_QM_UI_VIEW_ELEMENTS", "Alt+E", &O::elementNumbers),
+            flag("IDS_QM_UI_VIEW_SUPPORTS", "", &O::supports),
+            flag("IDS_QM_UI_VIEW_HINGES", "", &O::hinges),
+            flag("IDS_QM_UI_VIEW_DRIFTS", "", &O::drifts),
+            flag("IDS_QM_UI_VIEW_BEFORE", "", &O::undeformed)};
+}
+
+T_COMMANDS CMainWindow::WindowCommands()
+{
+    constexpr const char* kMenu = "IDS_QM_UI_MENU_LANGUAGE";
+    const auto speak = [this, kMenu](const char* key, const char* code) {
+        return T_COMMAND{kMenu, key,
+                         "",    [this, code] { SetLanguage(code); },
+                         {},    [code] { return MMSGFunction::GetLanguage() == code; }};
+    };
+    constexpr const char* kAnalysis = "IDS_QM_UI_MENU_ANALYSIS";
+    return {{kAnalysis, "IDS_QM_UI_ANALYSE", "F5", [this] { Analyse(); }},
+            speak("IDS_QM_UI_ENGLISH", "en"),
+            speak("IDS_QM_UI_ITALIAN", "it")};
+}
+
+int CMainWindow::Open(const QString& path)
+{
+    const int done = m_frame.OnOpen(path.toStdString());
+    if (done) AddRecent(QFileInfo(path).absoluteFilePath());
+    Refresh();
+    return done;
+}
+
+QString CMainWindow::AskSavePath()
+{
+    return AskFileName(this, true, Text("IDS_QM_UI_SAVE_TITLE"), Text("IDS_QM_UI_SAVE_FILTER"));
+}
+
+void CMainWindow::SaveAs()
+{
+    const QString path = AskSavePath();
+    if (!path.isEmpty() && m_frame.OnSaveAs(path.toStdString()))
+        AddRecent(QFileInfo(QString::fromStdString(m_doc.Path())).absoluteFilePath());
+    Refresh();
+}
+
+void CMainWindow::Analyse()
+{
+    (void)RunWithProgress(this, Text("IDS_QM_UI_ANALYSING"),
+                          [this](auto progress) { return m_frame.OnAnalyse(0, progress); });
+    Refresh();
+}
+
+void CMainWindow::ExportPicture()
+{
+    const QString path = AskFileName(this, true, Text("IDS_QM_UI_EXPORT_PICTURE_TITLE"),
+                                     Text("IDS_QM_UI_PICTURE_FILTER"));
+    std::string error;
+    if (path.isEmpty() || WritePictureFile(m_framePane->Drawing(), path.toStdString(), error))
+        return;
+    m_view.ShowMessage("IDS_QM_UI_FILE_REFUSED", error);
+}
+
+void CMainWindow::AddRecent(const QString& path)
+{
+    QStringList list = QSettings().value(kRecentKey).toStringList();
+    list.removeAll(path);
+    list.prepend(path);
+    QSettings().setValue(kRecentKey, list.mid(0, kMostRecent));
+}
+
+void CMainWindow::ShowRecent()
+{
+    m_recent->clear();
+    for (const QString& path : QSettings().value(kRecentKey).toStringList())
+        connect(m_recent->addAction(path), &QAction::triggered, this,
+                [this, path] { (void)Open(path); });
+    m_recent->setEnabled(!m_recent->isEmpty());
+}
+
+void CMainWindow::closeEvent(QCloseEvent* event)
+{
+    event->setAccepted(m_frame.OnClose() != 0);
+}

@@ -1,0 +1,75 @@
+// What a picture of the frame shows: the frame itself, and how it moves under a result.
+#pragma once
+
+#include "qm_db/dbdoc.h"
+
+struct T_SCENE_NODE {
+    int id = 0;
+    std::array<double, 3> xyz{};
+    T_DIRS6 held{}; // directions of the support
+};
+
+struct T_SCENE_LINE {
+    int id = 0;               // of the element
+    std::size_t i = 0, j = 0; // nodes by index
+    ELEM_KIND kind = ELEM_KIND::Beam;
+    bool hingeI = false, hingeJ = false; // plastic hinges that were generated
+};
+
+/// Lengths in the document's current units.
+struct T_FRAME_SCENE {
+    std::string title, lengthUnit;
+    std::vector<T_SCENE_NODE> nodes; // ascending ids
+    std::vector<T_SCENE_LINE> lines;
+};
+
+/// A result that the frame can be shown under.
+struct T_SHAPE_SOURCE {
+    enum class KIND { None, Static, Stage, Pushover, Mode };
+    KIND kind = KIND::None;
+    int key = 0; // of the load case, stage or pushover load case; the mode's number
+    std::string name;
+    int steps = 0; // of a stage or pushover load case; else 0
+    bool operator==(const T_SHAPE_SOURCE&) const = default;
+};
+
+/// Drift of a storey as a bar beside the frame.
+struct T_SCENE_DRIFT {
+    std::string name;
+    double bottom = 0.0, top = 0.0; // heights
+    double drift = 0.0;             // ratio, with its sign
+};
+
+/// The document must outlive the object. Everything is read again when the document has changed.
+class CFrameScene {
+public:
+    explicit CFrameScene(CDBDoc& doc) : m_doc(doc) {}
+
+    const T_FRAME_SCENE& Scene();
+    /// None first, then every load case, stage, pushover case and mode that has results.
+    std::vector<T_SHAPE_SOURCE> Sources();
+    /// Translations of the scene's nodes in current units (of a mode in its own normalisation), at
+    /// the end of the step, from 1. A pushover case has results in its direction of control alone;
+    /// nodes without results stay. 1 done; 0 Error says why, `out` as it was.
+    [[nodiscard]] int Read(const T_SHAPE_SOURCE& source, int step,
+                           std::vector<std::array<double, 3>>& out);
+    /// Drifts of a step of a pushover load case; empty where there are none.
+    std::vector<T_SCENE_DRIFT> Drifts(const T_SHAPE_SOURCE& source, int step);
+    /// A factor on the displacements, a round number, that makes the largest a twentieth of the
+    /// frame's size.
+    static double RoundScale(const T_FRAME_SCENE& scene,
+                             const std::vector<std::array<double, 3>>& displacement);
+    const std::string& Error() const { return m_error; }
+
+private:
+    using T_MOVES = std::vector<std::array<double, 3>>;
+    void Build();
+    int ReadPushover(int key, int step, T_MOVES& out);
+    template <class F>
+    int ReadNodes(F read, T_MOVES& out);
+
+    CDBDoc& m_doc;
+    T_FRAME_SCENE m_scene;
+    long m_revision = -1;
+    std::string m_error;
+};

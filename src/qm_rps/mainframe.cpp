@@ -1,0 +1,145 @@
+#include "qm_rps/mainframe.h"
+
+#include "qm_base/messagehistory.h"
+#include "qm_base/msgfunction.h"
+
+#include <filesystem>
+
+namespace {
+
+using zql::frx::ANSWER;
+using zql::lib::MMSGFunction;
+
+constexpr const char* kExtension = ".qmdb";
+
+std::string NameOfFile(const std::string& path)
+{
+    return path.empty() ? MMSGFunction::GetValue("IDS_QM_UI_UNTITLED")
+                        : std::filesystem::path(path).filename().string();
+}
+
+void Note(const char* key, const std::string& what)
+{
+    GSaveHistoryFormatNF("%s", MMSGFunction::Format(key, {what}).c_str());
+}
+
+} // namespace
+
+int CMainFrame::Refuse(const std::string& text)
+{
+    constexpr const char* kKey = "IDS_QM_UI_FILE_REFUSED";
+    ShowMessage(kKey, MMSGFunction::Format(kKey, {text}));
+    return 0;
+}
+
+std::string CMainFrame::Title() const
+{
+    std::string title = NameOfFile(m_doc.Path());
+    if (m_doc.Data().IsModified()) title += "*";
+    if (m_readOnly) title += " " + MMSGFunction::GetValue("IDS_QM_UI_READ_ONLY");
+    return title;
+}
+
+std::string CMainFrame::SavePath() const
+{
+    return m_readOnly || !m_doc.Path().ends_with(kExtension) ? std::string() : m_doc.Path();
+}
+
+/// Edits are saved or given up; false: the person wants to go on with the document.
+bool CMainFrame::MayReplace()
+{
+    if (!m_doc.Data().IsModified()) return true;
+    constexpr const char* kKey = "IDS_QM_UI_SAVE_CHANGES";
+    switch (AskYesNoCancel(kKey, MMSGFunction::Format(kKey, {NameOfFile(m_doc.Path())}))) {
+    case ANSWER::Yes: {
+        const std::string path = SavePath().empty() && m_askPath ? m_askPath() : SavePath();
+        return !path.empty() && OnSaveAs(path) != 0;
+    }
+    case ANSWER::No:
+        return true;
+    default:
+        return false;
+    }
+}
+
+int CMainFrame::OnNew()
+{
+    if (!MayReplace()) return 0;
+    m_doc.NewModel();
+    m_readOnly = false;
+    return 1;
+}
+
+int CMainFrame::OpenModel(const std::string& path)
+{
+    T_FILE_ERROR error;
+    if (m_doc.OpenModel(path, OPEN_MODE::Edit, error)) {
+        m_readOnly = false;
+        return 1;
+    }
+    if (error.fault != FILE_FAULT::NoAccess) return Refuse(error.text);
+    constexpr const char* kKey = "IDS_QM_UI_OPEN_READ_ONLY";
+    T_FILE_ERROR again;
+    if (!std::filesystem::exists(path) || !AskYesNo(kKey, MMSGFunction::Format(kKey, {error.text})))
+        return Refuse(error.text);
+    if (!m_doc.OpenModel(path, OPEN_MODE::ReadOnly, again)) return Refuse(again.text);
+    m_readOnly = true;
+    return 1;
+}
+
+int CMainFrame::OnOpen(const std::string& path)
+{
+    if (!MayReplace()) return 0;
+    if (CModelStore::IsModelFile(path)) {
+        if (!OpenModel(path)) return 0;
+    } else {
+        T_FILE_ERROR error;
+        if (!m_doc.ImportCase(path, error)) return Refuse(error.text);
+        m_readOnly = false;
+    }
+    Note("IDS_QM_UI_OPENED", path);
+    return 1;
+}
+
+int CMainFrame::OnSave()
+{
+    return SavePath().empty() ? 0 : OnSaveAs(SavePath());
+}
+
+int CMainFrame::OnSaveAs(const std::string& path)
+{
+    std::string to = path;
+    if (std::filesystem::path(to).extension().empty()) to += kExtension;
+    T_FILE_ERROR error;
+    if (!m_doc.SaveAs(to, error)) return Refuse(error.text);
+    m_readOnly = false;
+    Note("IDS_QM_UI_SAVED", to);
+    return 1;
+}
+
+int CMainFrame::OnExportCase(const std::string& path)
+{
+    T_FILE_ERROR error;
+    if (!m_doc.ExportCase(path, error)) return Refuse(error.text);
+    Note("IDS_QM_UI_SAVED", path);
+    return 1;
+}
+
+int CMainFrame::OnClose()
+{
+    return MayReplace() ? 1 : 0;
+}
+
+int CMainFrame::OnAnalyse(int modes, std::function<bool(std::size_t, std::size_t)> progress)
+{
+    T_ANALYSIS_OPTIONS options;
+    options.modes = modes;
+    options.progress = std::move(progress);
+    T_ANALYSIS_ERROR error;
+    if (!m_doc.RunAnalysis(options, error)) {
+        if (error.fault == ANALYSIS_FAULT::Cancelled) return 0;
+        return Refuse(error.text);
+    }
+    Note("IDS_QM_UI_ANALYSED", NameOfFile(m_doc.Path()));
+    return 1;
+}

@@ -1,0 +1,50 @@
+// Model of the main window: one document, opened, edited, analysed, saved and closed.
+#pragma once
+
+#include "qm_base/mdialog.h"
+#include "qm_db/dbdoc.h"
+
+class CMainFrame : public zql::frx::MDialog {
+public:
+    /// The document must outlive the frame.
+    explicit CMainFrame(CDBDoc& doc) : m_doc(doc) {}
+
+    CDBDoc& Doc() { return m_doc; }
+    /// "frame.qmdb", with a star while there are unsaved edits and a note where it is read only.
+    std::string Title() const;
+    bool IsReadOnly() const { return m_readOnly; }
+    /// Of a file that a save without a name goes to; empty: none yet, or it may not be written.
+    std::string SavePath() const;
+
+    // Each is 1 done; 0 refused with a message, or cancelled, and the document as it was.
+    // What replaces or ends the document asks to save its edits first.
+
+    [[nodiscard]] int OnNew();
+    /// A model file, or a case file, which is saved as a model file later. A model file that is
+    /// open elsewhere or may not be written is opened for reading, if the person wants that.
+    [[nodiscard]] int OnOpen(const std::string& path);
+    /// To SavePath; 0 also where that is empty (the caller asks for a name).
+    [[nodiscard]] int OnSave();
+    /// A path without extension gets that of a model file; ".json" writes a case file.
+    [[nodiscard]] int OnSaveAs(const std::string& path);
+    [[nodiscard]] int OnExportCase(const std::string& path);
+    /// May the window close? Edits are saved, given up, or the answer is no.
+    [[nodiscard]] int OnClose();
+
+    [[nodiscard]] int OnUndo() { return m_doc.Undo().Undo(); }
+    [[nodiscard]] int OnRedo() { return m_doc.Undo().Redo(); }
+
+    /// Every load case, the construction stages, and the eigen modes that are asked for.
+    [[nodiscard]] int OnAnalyse(int modes, std::function<bool(std::size_t, std::size_t)> progress);
+
+    /// Asks for the name of a file to save to; empty: cancelled.
+    std::function<std::string()> m_askPath;
+
+private:
+    int Refuse(const std::string& text);
+    bool MayReplace();
+    int OpenModel(const std::string& path);
+
+    CDBDoc& m_doc;
+    bool m_readOnly = false;
+};
