@@ -11,8 +11,8 @@ class CAnalysisRun {
 public:
     CAnalysisRun(CDataCtrl& data, CEditData& edit) : m_data(data), m_edit(edit) {}
 
-    /// One factorisation serves all load cases and the modes; construction stages have their own,
-    /// and their results stay in memory only. 1 done; 0 error filled and neither results nor modes
+    /// One factorisation serves all load cases and the modes; construction stages have their own.
+    /// 1 done; 0 error filled and neither results nor modes
     /// changed.
     [[nodiscard]] int Run(const T_ANALYSIS_OPTIONS& options, T_ANALYSIS_ERROR& error);
 

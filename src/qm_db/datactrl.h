@@ -80,9 +80,8 @@ public:
     /// The same for a static load case; null removes them.
     void SetStaticResult(int loadCase, std::shared_ptr<IStaticResult> result);
 
-    /// Results of the construction stages; null where there are none. They stay in memory: a model
-    /// file does not keep them.
-    const std::shared_ptr<IStagedResult>& StagedResult() const { return m_staged; }
+    /// Results of the construction stages; null where there are none.
+    const std::shared_ptr<IStagedResult>& StagedResult() const { return m_content.stagedResult; }
     void SetStagedResult(std::shared_ptr<IStagedResult> result);
 
     /// Adds a general combination under the next key, as an edit: within the open step, else as a
@@ -107,7 +106,6 @@ public:
 
 private:
     T_MODEL_CONTENT m_content;
-    std::shared_ptr<IStagedResult> m_staged;
     bool m_modified = false;
     long m_revision = 0;
     CEditData* m_editor = nullptr;
