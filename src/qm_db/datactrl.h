@@ -101,12 +101,18 @@ public:
     /// stays; the document counts as modified only when they differ from what is stored.
     void SetPoverSteps(int pushover, const T_POVR_D& steps);
 
+    /// While it is locked (an analysis is under way) no edit begins, changes a record, is undone or
+    /// done again.
+    void SetLocked(bool locked) { m_isLocked = locked; }
+    bool IsLocked() const { return m_isLocked; }
+
     /// For CEditData and CUndoCtrl only: the model to change; marks the document modified.
     T_MODEL& ModelForEdit();
 
 private:
     T_MODEL_CONTENT m_content;
     bool m_modified = false;
+    bool m_isLocked = false;
     long m_revision = 0;
     CEditData* m_editor = nullptr;
 };

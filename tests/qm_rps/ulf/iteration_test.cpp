@@ -7,6 +7,7 @@
 
 #include <filesystem>
 #include <gtest/gtest.h>
+#include <thread>
 
 namespace {
 
@@ -42,6 +43,13 @@ public:
     }
     int CloseEdit() override { return Do("close"); }
     void CancelEdit() override { (void)Do("cancel"); }
+    void UndoEdit() override { (void)Do("undo"); }
+    void CancelAnalysis() override
+    {
+        m_left = 0;
+        m_fail = "post";
+        (void)Do("stop");
+    }
     int StartAnalysis() override
     {
         m_left = m_busy;
@@ -88,7 +96,14 @@ public:
         dialog->m_iterate = m_accept-- > 0;
         return 1;
     }
-    void DispatchEvents() override { ++m_events; }
+    void DispatchEvents() override
+    {
+        ++m_events;
+        EXPECT_EQ(m_thread, std::this_thread::get_id());
+        if (m_onEvents) m_onEvents();
+    }
+    std::function<void()> m_onEvents;
+    std::thread::id m_thread = std::this_thread::get_id();
 };
 
 class UlfIteration : public testing::Test {
@@ -247,8 +262,8 @@ TEST_F(UlfIteration, StopsWhereTheHostRefuses)
         {"scale 0", ULF_ITER_END::NotScaled, "cancel", 1},
         {"scale 1", ULF_ITER_END::NotScaled, "cancel", 1},
         {"close", ULF_ITER_END::NotScaled, "cancel", 1},
-        {"analyse", ULF_ITER_END::NotAnalysed, "analyse", 1},
-        {"post", ULF_ITER_END::NotAnalysed, "post", 1},
+        {"analyse", ULF_ITER_END::NotAnalysed, "save frame_01.ext", 1},
+        {"post", ULF_ITER_END::NotAnalysed, "save frame_01.ext", 1},
         {"solve1", ULF_ITER_END::NotSolved, "solve1", 1},
     };
     const CScriptedHost fresh;
@@ -264,6 +279,8 @@ TEST_F(UlfIteration, StopsWhereTheHostRefuses)
         EXPECT_EQ(c.end, run.End()) << c.fail;
         EXPECT_EQ(c.last, host.m_log.back()) << c.fail;
         EXPECT_EQ(c.blocks, Blocks()) << c.fail;
+        const bool undone = std::count(host.m_log.begin(), host.m_log.end(), "undo") > 0;
+        EXPECT_EQ(c.end == ULF_ITER_END::NotAnalysed, undone) << c.fail;
     }
 }
 
@@ -314,6 +331,80 @@ TEST_F(UlfIteration, CancelsBetweenIterationsWithEverythingReported)
     EXPECT_EQ(3U, Blocks());
 }
 
+TEST_F(UlfIteration, CancelDuringAnAnalysisTakesTheLoadsBack)
+{
+    m_host.m_factors = {{2, 1}};
+    m_host.m_busy = 3;
+    std::vector<int> told;
+    m_progress = [&](int done, int) {
+        told.push_back(done);
+        return told.size() != 7; // in the second analysis, after its second look at the events
+    };
+    EXPECT_EQ(0, Run());
+    EXPECT_EQ(ULF_ITER_END::Cancelled, m_end);
+    EXPECT_EQ((std::vector<int>{0, 0, 0, 0, 1, 1, 1}), told);
+    const LINES end{"analyse", "dispatch", "dispatch", "stop", "post", "undo", "save frame_02.ext"};
+    ASSERT_GT(m_host.m_log.size(), end.size());
+    EXPECT_EQ(end, LINES(m_host.m_log.end() - static_cast<int>(end.size()), m_host.m_log.end()));
+    EXPECT_EQ(2U, m_history.size());
+    EXPECT_EQ(2U, Blocks());
+}
+
+// The two trusses of twotrusses.h with the tension that they had, whatever ends the analysis.
+TEST_F(UlfIteration, LeavesTheDocumentAsAfterTheLastIterationWhenAnAnalysisEndsEarly)
+{
+    for (const bool cancel : {true, false}) {
+        CDBDoc doc;
+        doc.Data().Assign(two::Content());
+        T_FILE_ERROR error;
+        ASSERT_EQ(1, doc.SaveAs(m_folder + "/frame.qmdb", error)) << error.text;
+        T_ANALYSIS_OPTIONS options;
+        options.allCases = false;
+        T_ANALYSIS_ERROR fault;
+        ASSERT_EQ(1, doc.RunAnalysis(options, fault)) << fault.text;
+        CUlfStageResults results(doc);
+        CUnknownStageItemDlg dialog(doc, results, 1);
+        CUlfIterationDocHost host(doc, dialog, &m_person);
+        CUlfIteration run(host, {});
+        dialog.SetView(&m_person);
+        m_person.m_overwrite = true;
+        double whileRunning = 0.0;
+        bool asked = false;
+        m_person.m_onEvents = [&] {
+            EXPECT_TRUE(doc.IsExcuted());
+            EXPECT_FALSE(doc.Edit().Begin("meanwhile"));
+            EXPECT_EQ(0, doc.Undo().Undo());
+            whileRunning = doc.Data().Model().loadCases.at(2).pretension.at(0).force;
+            asked = cancel;
+            if (cancel)
+                doc.CancelAnalysis();
+            else
+                std::filesystem::remove_all(m_folder); // its results can't be saved
+        };
+        run.m_progress = [&](int, int) { return !asked; };
+        EXPECT_EQ(0, dialog.OnIterate(run));
+        EXPECT_EQ(cancel ? ULF_ITER_END::Cancelled : ULF_ITER_END::NotAnalysed, run.End());
+        EXPECT_NEAR(4.0, whileRunning, 1e-12);
+        EXPECT_EQ(1.0, doc.Data().Model().loadCases.at(2).pretension.at(0).force);
+        EXPECT_EQ(1U, run.History().size());
+        EXPECT_FALSE(doc.IsExcuted());
+        EXPECT_TRUE(doc.IsPostMode()) << doc.Post().Error(); // with the results of that tension
+        T_DOF6 u{};
+        doc.Post().SelectStage(1, kStageFirstStep, kStageLoadSum);
+        ASSERT_EQ(1, doc.Post().GetDspcNew(2, u)) << doc.Post().Error();
+        EXPECT_NEAR(3.0 / 20, u[0], 1e-12);
+        EXPECT_FALSE(doc.Undo().CanUndo());
+        if (!cancel) continue;
+        EXPECT_EQ("", host.Error());
+        EXPECT_EQ(1U, Blocks());
+        CDBDoc other; // the file has them too
+        ASSERT_EQ(1, other.OpenModel(doc.Path(), OPEN_MODE::ReadOnly, error)) << error.text;
+        EXPECT_EQ(doc.Data().Model(), other.Data().Model());
+        EXPECT_TRUE(other.IsPostMode()) << other.Post().Error();
+        EXPECT_FALSE(doc.Data().IsModified());
+    }
+}
+
 TEST_F(UlfIteration, BringsATwoTrussFrameToItsTensionInOneIteration)
 {
     CDBDoc doc;
@@ -340,12 +431,13 @@ TEST_F(UlfIteration, BringsATwoTrussFrameToItsTensionInOneIteration)
     doc.Post().SelectStage(1, kStageFirstStep, kStageLoadSum);
     ASSERT_EQ(1, doc.Post().GetDspcNew(2, u));
     EXPECT_NEAR(0.0, u[0], 1e-12);
-    // The copy on disk has the new tension, the model itself the old one.
+    // The copy on disk has the new tension with its results, the model itself the old one.
     for (const auto& [name, force] :
          {std::pair{"/frame.qmdb", 1.0}, std::pair{"/frame_01.qmdb", 4.0}}) {
         CDBDoc other;
         ASSERT_EQ(1, other.OpenModel(m_folder + name, OPEN_MODE::ReadOnly, error)) << error.text;
         EXPECT_NEAR(force, other.Data().Model().loadCases.at(2).pretension.at(0).force, 1e-12);
+        EXPECT_EQ(force > 1, other.IsPostMode()) << name;
     }
     // One command of the person takes the change back.
     EXPECT_EQ("Change load values for iterative analysis", doc.Undo().UndoTitle());
