@@ -8,6 +8,7 @@
 #include "qm_rps/ulfiterationresultdlg.h"
 #include "qm_rps/ulfstageresults.h"
 #include "qm_rps/unknownloadfactoriteranal.h"
+#include "ulfrun.h"
 
 #ifdef QM_UI
 #include "qm_ui/iterationplot.h"
@@ -134,15 +135,6 @@ EXIT_CODE CheckOptions(const T_ITERATE_OPTIONS& o)
     return EXIT_CODE::Done;
 }
 
-EXIT_CODE AnalyseStages(CDBDoc& doc, const std::string& file)
-{
-    T_ANALYSIS_OPTIONS options;
-    options.allCases = false;
-    T_ANALYSIS_ERROR error;
-    if (doc.RunAnalysis(options, error)) return EXIT_CODE::Done;
-    return Complain(EXIT_CODE::BadInput, file + ": " + error.text);
-}
-
 EXIT_CODE WriteResults(const CUlfIteration& run, const T_ITERATE_OPTIONS& o, const char* status)
 {
     if (!o.json.empty()) {
@@ -171,6 +163,7 @@ EXIT_CODE RunUlfIterate(const T_ITERATE_OPTIONS& o)
                         o.file + ": no construction-stage item named \"" + o.item + "\"");
     CUlfStageResults results(doc);
     CUnknownStageItemDlg dialog(doc, results, key);
+    dialog.m_sumStageLoads = o.sumStageLoads;
     if (const auto findings = dialog.Findings(); !findings.empty())
         return Complain(EXIT_CODE::BadInput, o.file + ": " + findings.front().text);
     if (const EXIT_CODE code = AnalyseStages(doc, o.file); code != EXIT_CODE::Done) return code;

@@ -10,13 +10,17 @@ using zql::lib::MMSGFunction;
 
 namespace {
 
+/// Items of both kinds, static and of construction stages.
 std::string ItemsThatUse(const T_MODEL& model, const std::string& constraint)
 {
     std::string names;
-    for (const auto& [key, item] : model.ulfItems)
-        if (std::find(item.constraints.begin(), item.constraints.end(), constraint) !=
-            item.constraints.end())
-            names += (names.empty() ? "" : ", ") + item.name;
+    const auto collect = [&](const auto& table) {
+        for (const auto& [key, item] : table)
+            if (std::ranges::find(item.constraints, constraint) != item.constraints.end())
+                names += (names.empty() ? "" : ", ") + item.name;
+    };
+    collect(model.ulfItems);
+    collect(model.ulfStageItems);
     return names;
 }
 
