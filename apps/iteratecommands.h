@@ -20,6 +20,6 @@ struct T_ITERATE_OPTIONS {
 /// Analyses the stages, then scales pretension, analyses and solves until the factors are 1. Copies
 /// FILE_01, FILE_02 ... and the report stand beside the file, which stays as it was. Done:
 /// converged, or no iteration was asked for; NotFound: not converged in the required number,
-/// cancelled, or no factors; NoAccess: also when the report is there and neither overwrite nor
-/// append was asked for.
+/// cancelled, no factors, or factors that do not meet the constraints; NoAccess: also when the
+/// report is there and neither overwrite nor append was asked for.
 EXIT_CODE RunUlfIterate(const T_ITERATE_OPTIONS& options);

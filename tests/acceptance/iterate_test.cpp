@@ -127,6 +127,25 @@ TEST_F(Iterate, RunsAwayNoFurtherThanRequiredAndShowsHow)
     EXPECT_EQ(3U, Blocks());
 }
 
+// T1 and T2 pull node 2 apart: of u = 0 and u = 0.2 both are missed by 0.1, with T1 = 1, T2 = -1.
+TEST_F(Iterate, FactorsOfOneThatMissTheConstraintsAreNoSuccess)
+{
+    json document = json::parse(kStageCase);
+    document.at("load_cases")
+        .push_back({{"name", "T2"}, {"pretension", {{{"element", 2}, {"force", 1}}}}});
+    document.at("stages").at(0).at("activate").at("loads").push_back({{"case", "T2"}});
+    json& item = document.at("ulf_stage_items").at(0);
+    item.at("unknown").push_back({{"stage", "S1"}, {"case", "T2"}, {"pretension", true}});
+    item.at("constraints").push_back("U02");
+    WriteText(m_file, document.dump());
+    const T_RUN run = Run("STAY", {"--json", "-"});
+    EXPECT_EQ(1, run.code);
+    EXPECT_NE(std::string::npos, run.err.find("HOLD (S1/Last Step), U02")) << run.err;
+    const json r = json::parse(run.out);
+    EXPECT_EQ("constraints not met", r.at("status"));
+    EXPECT_NEAR(0.0, r.at("history").back().at("tolerance").get<double>(), 1e-9);
+}
+
 TEST_F(Iterate, SolvesOnceWhenNoIterationIsRequired)
 {
     const T_RUN run = Run("STAY", {"--iterations", "0", "--json", "-"});
