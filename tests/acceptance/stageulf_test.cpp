@@ -147,7 +147,7 @@ TEST_F(StageUlf, RefusesANameOfBothKinds)
     EXPECT_NE(std::string::npos, solve.err.find("another name")) << solve.err;
     const T_RUN check = Ulf({"check", "--item", "STAY"});
     EXPECT_EQ(1, check.code);
-    EXPECT_NE(std::string::npos, check.out.find("2 items, 1 findings")) << check.out;
+    EXPECT_NE(std::string::npos, check.out.find("2 items, 2 findings")) << check.out;
 }
 
 TEST_F(StageUlf, TellsWhyTheStagesCannotBeAnalysed)

@@ -1,6 +1,8 @@
 #include "qm_base/messagehistory.h"
 #include "qm_rps/ulfexplain.h"
 #include "qm_rps/ulfstageresults.h"
+#include "qm_rps/unknownloadfactorconstraintdlg.h"
+#include "qm_rps/unknownloadfactordlg.h"
 #include "qm_rps/unknownloadfactorresultdlg.h"
 #include "qm_rps/unknownstageitemdlg.h"
 #include "qm_rps/unknowntabletabgrid1.h"
@@ -25,6 +27,20 @@ protected:
     CDBDoc m_doc;
     CUlfStageResults m_results{m_doc};
     std::optional<CUnknownStageItemDlg> m_dialog;
+};
+
+/// Gives an item dialog a name and accepts it.
+class CNamer : public zql::frx::IDialogView {
+public:
+    std::string m_name;
+    void ShowMessage(const std::string&, const std::string&) override {}
+    bool AskYesNo(const std::string&, const std::string&) override { return false; }
+    int RunModal(zql::frx::MDialog& child) override
+    {
+        auto* item = dynamic_cast<CUlfItemDialog*>(&child);
+        if (item) item->m_name = m_name;
+        return item ? child.OnOK() : 0;
+    }
 };
 
 std::string TextAt(const T_SHEET& sheet, std::size_t row, std::size_t column)
@@ -133,12 +149,45 @@ TEST_F(StageItem, ExplainsAContradictionAndASignByItsRow)
     EXPECT_NE(std::string::npos, m_dialog->Messages().back().text.find("(S1/First Step T)"));
 }
 
-TEST_F(StageItem, HoldsItsConstraintsInTheTable)
+TEST_F(StageItem, HoldsItsConstraintsInTheTableAndTakesTheirNewNames)
 {
-    Open(two::Content());
+    T_MODEL_CONTENT content = two::Content();
+    content.model.ulfConstraints[1].stage = 1;
+    Open(std::move(content));
     CUnknownTableTabGrid1 grid(m_doc);
     grid.m_selected = 1;
+    EXPECT_EQ("DX of node 2 =      0.0000 (S1/Last Step)", grid.Rows().at(0).description);
     EXPECT_EQ(0, grid.OnDelete());
     EXPECT_NE(std::string::npos, grid.Messages().back().text.find("STAY"));
     EXPECT_TRUE(m_doc.Data().Model().ulfConstraints.contains(1));
+    CUnknownLoadFactorConstraintDlg constraint(m_doc, 1);
+    constraint.m_constraint.name = "FAST";
+    ASSERT_EQ(1, constraint.OnOK());
+    EXPECT_EQ(std::vector<std::string>{"FAST"},
+              m_doc.Data().Model().ulfStageItems.at(1).constraints);
+    EXPECT_EQ(1, m_doc.Undo().Undo());
+    EXPECT_EQ("HOLD", m_doc.Data().Model().ulfStageItems.at(1).constraints.at(0));
+}
+
+TEST_F(StageItem, IsListedChangedAndDeletedWithTheStaticOnes)
+{
+    m_doc.Data().Assign(two::Content());
+    CNamer view;
+    CUnknownLoadFactorDlg list(m_doc);
+    list.SetView(&view);
+    list.m_selected = 1;
+    EXPECT_EQ(0, list.OnModify()) << "there is no static item 1";
+    list.m_stage = true;
+    view.m_name = "STAY 2";
+    ASSERT_EQ(1, list.OnModify());
+    ASSERT_EQ(1U, list.Rows().size());
+    EXPECT_EQ((CUnknownLoadFactorDlg::T_ROW{1, "STAY 2", "", true}), list.Rows()[0]);
+    EXPECT_EQ(0, list.OnAddStage()) << "an empty item is refused";
+    EXPECT_EQ(1, list.m_selected);
+    ASSERT_EQ(1, list.OnDelete());
+    EXPECT_TRUE(m_doc.Data().Model().ulfStageItems.empty());
+    CDBDoc empty;
+    CUnknownLoadFactorDlg none(empty);
+    EXPECT_EQ(0, none.OnAddStage());
+    EXPECT_EQ("IDS_QM_ULSI_NO_STAGES", none.Messages().back().key);
 }
