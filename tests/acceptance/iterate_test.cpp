@@ -177,8 +177,9 @@ TEST_F(Iterate, InterruptedItEndsAfterACompleteIteration)
     // interrupted while it waits with a block of an iteration.
     const T_RUN run =
         RunShell("mkfifo m.ulf; qm-rps ulf iterate m.json --item DOUBLE --iterations 60 --append "
-                 "--json r.json & pid=$!; timeout 20 cat m.ulf > all; sleep 0.5; kill -INT $pid; "
-                 "timeout 20 cat m.ulf >> all; wait $pid",
+                 "--json r.json & pid=$!; (sleep 30; kill -KILL $pid) >/dev/null 2>&1 & guard=$!; "
+                 "timeout 10 cat m.ulf > all; sleep 0.5; kill -INT $pid; "
+                 "timeout 10 cat m.ulf >> all; wait $pid; code=$?; kill $guard; exit $code",
                  m_folder.Path());
     EXPECT_EQ(1, run.code) << run.err;
     EXPECT_NE(std::string::npos, run.err.find("cancelled")) << run.err;
