@@ -63,6 +63,8 @@ TEST_F(StageUlf, SolvesFromACaseFileAndFromAModelFile)
         EXPECT_EQ("S1/Last Step", r.at("constraints").at(0).at("place"));
         EXPECT_NEAR(0.0, r.at("constraints").at(0).at("value").get<double>(), 1e-15);
     }
+    const json square = json::parse(Ulf({"solve", "--item", "LEAST", "--json", "-"}).out);
+    EXPECT_NEAR(4.0, square.at("objective").get<double>(), 1e-8); // the square of T = 2
     const T_RUN least = Ulf({"solve", "--item", "LEAST"});
     EXPECT_EQ(0, least.code) << least.err;
     EXPECT_NE(std::string::npos, least.out.find("stage/step case")) << least.out;
