@@ -8,11 +8,13 @@
 #include "qm_rps/ulfiterationresultdlg.h"
 #include "qm_rps/ulfstageresults.h"
 #include "qm_rps/unknownloadfactoriteranal.h"
+#include "ulfrun.h"
 
 #ifdef QM_UI
 #include "qm_ui/iterationplot.h"
 #endif
 
+#include <algorithm>
 #include <atomic>
 #include <csignal>
 #include <cstdio>
@@ -76,8 +78,11 @@ constexpr T_END_WORDS kEnds[] = {
     {ULF_ITER_END::NotAnalysed, "not analysed", EXIT_CODE::BadInput},
 };
 
-T_END_WORDS WordsOf(const CUlfIteration& run, const T_ITERATE_OPTIONS& o)
+T_END_WORDS WordsOf(const CUlfIteration& run, const T_ITERATE_OPTIONS& o, bool met)
 {
+    const bool done = run.End() == ULF_ITER_END::Required ? o.iterations == 0
+                                                          : run.End() == ULF_ITER_END::Converged;
+    if (done && !met) return {run.End(), "constraints not met", EXIT_CODE::NotFound};
     if (run.End() == ULF_ITER_END::Required && o.iterations == 0)
         return {run.End(), "solved", EXIT_CODE::Done};
     for (const T_END_WORDS& words : kEnds)
@@ -134,15 +139,6 @@ EXIT_CODE CheckOptions(const T_ITERATE_OPTIONS& o)
     return EXIT_CODE::Done;
 }
 
-EXIT_CODE AnalyseStages(CDBDoc& doc, const std::string& file)
-{
-    T_ANALYSIS_OPTIONS options;
-    options.allCases = false;
-    T_ANALYSIS_ERROR error;
-    if (doc.RunAnalysis(options, error)) return EXIT_CODE::Done;
-    return Complain(EXIT_CODE::BadInput, file + ": " + error.text);
-}
-
 EXIT_CODE WriteResults(const CUlfIteration& run, const T_ITERATE_OPTIONS& o, const char* status)
 {
     if (!o.json.empty()) {
@@ -171,6 +167,7 @@ EXIT_CODE RunUlfIterate(const T_ITERATE_OPTIONS& o)
                         o.file + ": no construction-stage item named \"" + o.item + "\"");
     CUlfStageResults results(doc);
     CUnknownStageItemDlg dialog(doc, results, key);
+    dialog.m_sumStageLoads = o.sumStageLoads;
     if (const auto findings = dialog.Findings(); !findings.empty())
         return Complain(EXIT_CODE::BadInput, o.file + ": " + findings.front().text);
     if (const EXIT_CODE code = AnalyseStages(doc, o.file); code != EXIT_CODE::Done) return code;
@@ -186,7 +183,9 @@ EXIT_CODE RunUlfIterate(const T_ITERATE_OPTIONS& o)
     const T_INTERRUPT interrupt;
     const int done = dialog.OnIterate(run);
     if (isatty(STDERR_FILENO) && run.History().size() > 1) std::fprintf(stderr, "\n");
-    const T_END_WORDS words = WordsOf(run, o);
+    const auto& result = dialog.Result();
+    const bool met = result && std::ranges::all_of(UlfResultRows(*result), &T_ULF_RESULT_ROW::met);
+    const T_END_WORDS words = WordsOf(run, o, met);
     const std::string reason = host.Error().empty() ? view.m_message : host.Error();
     if (!done || words.code != EXIT_CODE::Done)
         Complain(words.code, o.file + ": " + words.status + (reason.empty() ? "" : ": " + reason));
