@@ -8,10 +8,9 @@
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 
-namespace fs = std::filesystem;
-
 namespace {
 
+namespace fs = std::filesystem;
 using json = nlohmann::json;
 
 /// A document analysed in its stages.
@@ -62,23 +61,36 @@ private:
 
 struct T_ITERATED {
     json history;
-    std::string model; // the last copy
+    std::string first, last; // models
 };
 
-/// Imports an example and iterates it through the program.
-T_ITERATED Iterated(const CTempFolder& folder, const std::string& example, const std::string& item)
+json Iterate(const std::string& model, const std::string& item, const std::string& most)
 {
-    const std::string model = folder / "bridge.qmdb";
-    const T_RUN import = RunProgram({"import", ExampleCase(example), model});
-    EXPECT_EQ(0, import.code) << import.err;
     const T_RUN run = RunProgram({"ulf", "iterate", model, "--item", item, "--tolerance", "1e-6",
-                                  "--iterations", "20", "--json", "-"});
+                                  "--iterations", most, "--json", "-"});
     EXPECT_EQ(0, run.code) << run.err;
-    T_ITERATED result{json::parse(run.out), model};
-    EXPECT_EQ("converged", result.history.at("status"));
-    const json& steps = result.history.at("history");
-    result.model = (folder.Path() / fs::path(steps.back().at("file").get<std::string>())).string();
-    return result;
+    return json::parse(run.out);
+}
+
+/// Imports a case file and iterates it through the program.
+T_ITERATED Iterated(const CTempFolder& folder, const std::string& file, const std::string& item)
+{
+    T_ITERATED r{{}, folder / "bridge.qmdb", {}};
+    const T_RUN import = RunProgram({"import", file, r.first});
+    EXPECT_EQ(0, import.code) << import.err;
+    const json result = Iterate(r.first, item, "20");
+    EXPECT_EQ("converged", result.at("status"));
+    r.history = result.at("history");
+    r.last = r.history.back().at("file").get<std::string>();
+    return r;
+}
+
+double LargestOffOne(const json& factors)
+{
+    double largest = 0.0;
+    for (const json& row : factors)
+        largest = std::max(largest, std::fabs(1.0 - row.at("factor").get<double>()));
+    return largest;
 }
 
 /// What the named displacements of an item miss, largest.
@@ -95,23 +107,59 @@ double LargestMiss(CStages& stages)
 TEST(Stages, TunedBridgeKeepsItsConstraintsWhenAnalysedFromItsFile)
 {
     const CTempFolder folder;
-    const T_ITERATED run = Iterated(folder, "cable-stayed-bridge-staged", "STAYS");
-    const json& history = run.history.at("history");
-    EXPECT_GT(history.size(), 2U) << "axial forces and sag need more than one iteration";
-    for (const json& row : history.back().at("factors"))
-        EXPECT_NEAR(1.0, row.at("factor").get<double>(), 1e-6);
-    CStages before(folder / "bridge.qmdb"), after(run.model);
-    const double untuned = LargestMiss(before), tuned = LargestMiss(after);
+    const T_ITERATED run = Iterated(folder, ExampleCase("cable-stayed-bridge-staged"), "STAYS");
+    EXPECT_GT(run.history.size(), 2U) << "axial forces and sag need more than one iteration";
+    EXPECT_LE(LargestOffOne(run.history.back().at("factors")), 1e-6);
+
+    // Here, in another process than the one that wrote the file; then by the program once more.
+    CStages before(run.first), after(run.last);
+    const double untuned = LargestMiss(before);
     EXPECT_GT(untuned, 0.1); // m
-    EXPECT_LT(tuned, 1e-6 * untuned);
-    // 45 % of 1860 MPa would do for service; nothing may be slack or beyond the strength.
+    EXPECT_LT(LargestMiss(after), 1e-6 * untuned);
+    const json again = Iterate(run.last, "STAYS", "0").at("history");
+    ASSERT_EQ(1U, again.size());
+    EXPECT_LE(LargestOffOne(again.front().at("factors")), 1e-6);
+
+    // Nothing slack, nothing overstressed: up to 55 % of 1860 MPa.
     const double kArea[] = {60, 40, 35, 30, 30, 35, 40, 65}; // cm2
     for (int s = 101; s <= 108; ++s) {
         EXPECT_GT(after.Axial(s, after.LastStage()), 0.0) << s;
-        EXPECT_LT(after.Axial(s, after.LastStage()), 186.0 * kArea[s - 101]) << s;
-        std::printf("N %d %.3f\n", s, after.Axial(s, after.LastStage()));
+        EXPECT_LT(after.Axial(s, after.LastStage()), 0.55 * 186.0 * kArea[s - 101]) << s;
     }
-    std::printf("untuned %.6g tuned %.6g\n", untuned, tuned);
+}
+
+TEST(Stages, FirstOrderBridgeConvergesInOneIteration)
+{
+    const CTempFolder folder;
+    std::string text = ReadText(ExampleCase("cable-stayed-bridge-staged"));
+    const std::string options = R"("geometric_stiffness": true, "cable_sag": true)";
+    ASSERT_NE(std::string::npos, text.find(options));
+    text.replace(text.find(options), options.size(), R"("birth": "deformed")");
+    WriteText(folder / "first.json", text);
+    const T_ITERATED run = Iterated(folder, folder / "first.json", "STAYS");
+    ASSERT_EQ(2U, run.history.size());
+    EXPECT_GT(run.history.front().at("tolerance").get<double>(), 1.0);
+    EXPECT_LT(run.history.back().at("tolerance").get<double>(), 1e-10);
+}
+
+TEST(Stages, TwoHangersHaveTheReactionsOfABeamOnThreeSupports)
+{
+    // q = 20 kN/m, L = 10 m; each hanger E A / L = 1e4 kN/m. Finished: 10/8 q L and 3/8 q L. While
+    // piece 1 is alone, its hanger carries q L / 2 = 100 of the 250 that it was stressed by.
+    const CTempFolder folder;
+    const T_ITERATED run = Iterated(folder, ExampleCase("staged-two-hangers"), "HANGERS");
+    ASSERT_EQ(2U, run.history.size());
+    const json& factors = run.history.front().at("factors");
+    EXPECT_NEAR(2.5, factors.at(0).at("factor").get<double>(), 1e-12);
+    EXPECT_NEAR(0.75, factors.at(1).at("factor").get<double>(), 1e-12);
+    EXPECT_LE(LargestOffOne(run.history.back().at("factors")), 1e-12);
+    CStages stages(run.last);
+    EXPECT_NEAR(0.015, stages.Displacement(2, 1)[2], 1e-12);
+    EXPECT_NEAR(100.0, stages.Axial(11, 1), 1e-9);
+    EXPECT_NEAR(0.0, stages.Displacement(2, 2)[2], 1e-12);
+    EXPECT_NEAR(0.0, stages.Displacement(3, 2)[2], 1e-12);
+    EXPECT_NEAR(250.0, stages.Axial(11, 2), 1e-9);
+    EXPECT_NEAR(75.0, stages.Axial(12, 2), 1e-9);
 }
 
 /// Tensions and births from tests/oracle/backward.py.
@@ -133,7 +181,6 @@ void ExpectForwardAssembly(const std::string& name)
     }
     EXPECT_GT(size, 0.1); // m
     EXPECT_LT(miss, 1e-6 * size);
-    std::printf("%s size %.6g miss %.3g\n", name.c_str(), size, miss);
     for (const auto& [stay, n] : target.at("stay").items())
         EXPECT_NEAR(n.get<double>(), stages.Axial(std::stoi(stay), stages.LastStage()),
                     1e-6 * n.get<double>())
@@ -151,7 +198,6 @@ void ExpectForwardAssembly(const std::string& name)
         }
     }
     EXPECT_LT(wrong, 1e-6 * force);
-    std::printf("force %.6g wrong %.3g\n", force, wrong);
 }
 
 TEST(Stages, TensionsFoundBackwardsLeadForwardsToTheTargetInFirstOrder)
