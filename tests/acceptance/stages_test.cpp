@@ -162,6 +162,36 @@ TEST(Stages, TwoHangersHaveTheReactionsOfABeamOnThreeSupports)
     EXPECT_NEAR(75.0, stages.Axial(12, 2), 1e-9);
 }
 
+TEST(Stages, MoreUnknownsThanEquationsEndAtTheRequiredNumberWithTheirHistory)
+{
+    // The least sum of squares shifts the load to the hanger that does most, more at each scaling.
+    const CTempFolder folder;
+    std::string text = ReadText(ExampleCase("staged-two-hangers"));
+    const std::string both = R"(["level 2", "level 3"])";
+    ASSERT_NE(std::string::npos, text.find(both));
+    WriteText(folder / "one.json", text.replace(text.find(both), both.size(), R"(["level 3"])"));
+    const T_RUN run = RunProgram({"ulf", "iterate", folder / "one.json", "--item", "HANGERS",
+                                  "--iterations", "6", "--json", "-"});
+    EXPECT_EQ(1, run.code) << run.err;
+    const json result = json::parse(run.out);
+    EXPECT_EQ("not converged", result.at("status"));
+    ASSERT_EQ(7U, result.at("history").size());
+    for (std::size_t k = 1; k < 7; ++k)
+        EXPECT_GE(result.at("history").at(k).at("tolerance").get<double>(),
+                  result.at("history").at(k - 1).at("tolerance").get<double>() - 1e-9);
+}
+
+TEST(Stages, TheBridgeIsWhatItsScriptWrites)
+{
+    const CTempFolder folder;
+    if (RunShell("python3 --version", folder.Path()).code != 0)
+        GTEST_SKIP() << "python3 is not installed";
+    const fs::path script = ProjectFolder() / "tests/oracle/stagedbridge.py";
+    const T_RUN run = RunShell("python3 -B " + script.string() + " -o b.json", folder.Path());
+    ASSERT_EQ(0, run.code) << run.err;
+    EXPECT_EQ(ReadText(ExampleCase("cable-stayed-bridge-staged")), ReadText(folder / "b.json"));
+}
+
 /// Tensions and births from tests/oracle/backward.py.
 void ExpectForwardAssembly(const std::string& name)
 {
