@@ -51,9 +51,11 @@ T_PLOT IterationPlot(const std::string& item, const T_ULF_ITER_SETTINGS& setting
     T_PLOT plot;
     if (history.empty()) return plot;
     plot.title = "Iterative analysis for pretension: " + item;
-    plot.subtitle =
-        FormatText("%d of %d iterations, tolerance %.3g at the end", history.back().iteration,
-                   settings.required, history.back().tolerance);
+    const T_ULF_ITER_STEP& end = history.back();
+    const bool converged = end.iteration > 0 && settings.tolerance >= end.tolerance;
+    plot.subtitle = FormatText("%s after %d of at most %d iterations, tolerance %.3g",
+                               converged ? "Converged" : "Not converged", end.iteration,
+                               settings.required, end.tolerance);
     plot.x.title = "Iteration";
     plot.x.range = T_PLOT_RANGE{-0.2, std::max(1, history.back().iteration) + 0.2};
     for (const T_ULF_ITER_STEP& step : history)
