@@ -23,9 +23,9 @@
 
 namespace {
 
-std::atomic<bool> g_cancel{false}; // set by an interrupt, read between iterations
+std::atomic<bool> g_cancel{false}; // set by an interrupt
 
-/// While it lives, an interrupt ends the run after the iteration at hand.
+/// While it lives, an interrupt ends the run; the iteration at hand is taken back.
 struct T_INTERRUPT {
     T_INTERRUPT() : before(std::signal(SIGINT, [](int) { g_cancel = true; })) {}
     ~T_INTERRUPT() { std::signal(SIGINT, before); }
@@ -52,14 +52,22 @@ private:
     bool m_overwrite;
 };
 
-bool ShowProgress(int done, int required)
-{
-    if (isatty(STDERR_FILENO)) {
-        std::fprintf(stderr, "\rqm-rps: %d of at most %d iterations done", done, required);
-        std::fflush(stderr);
+/// A line on a terminal that changes with each iteration.
+class CProgressLine {
+public:
+    bool operator()(int done, int required)
+    {
+        if (done != m_shown && isatty(STDERR_FILENO)) {
+            std::fprintf(stderr, "\rqm-rps: %d of at most %d iterations done", done, required);
+            std::fflush(stderr);
+        }
+        m_shown = done;
+        return !g_cancel;
     }
-    return !g_cancel;
-}
+
+private:
+    int m_shown = -1;
+};
 
 struct T_END_WORDS {
     ULF_ITER_END end;
@@ -97,6 +105,7 @@ std::string StepJson(const T_ULF_ITER_STEP& step)
                        ", \"factors\": [";
     for (std::size_t i = 0; i < step.rows.size(); ++i)
         text += std::string(i ? ", " : "") + "{\"place\": " + JsonText(step.rows[i].place) +
+                ", \"case\": " + JsonText(step.rows[i].load) +
                 ", \"factor\": " + ShortestText(step.rows[i].factor + 0.0) +
                 ", \"pretension\": " + (step.rows[i].pretension ? "true" : "false") + "}";
     return text + "]}";
@@ -108,7 +117,11 @@ std::string HistoryJson(const CUlfIteration& run, const char* status)
                        ",\n \"report\": " + JsonText(run.ReportPath()) + ",\n \"history\": [";
     for (const T_ULF_ITER_STEP& step : run.History())
         text += (step.iteration ? ",\n  " : "\n  ") + StepJson(step);
-    return text + "\n ]\n}\n";
+    text += "\n ],\n \"applied\": [";
+    const std::vector<double> applied = UlfIterApplied(run.History());
+    for (std::size_t i = 0; i < applied.size(); ++i)
+        text += (i ? ", " : "") + ShortestText(applied[i]);
+    return text + "]\n}\n";
 }
 
 void PrintHistory(const CUlfIteration& run)
@@ -117,10 +130,13 @@ void PrintHistory(const CUlfIteration& run)
     for (const T_ULF_ITER_STEP& step : run.History())
         std::printf("%9d %14.6g  %s\n", step.iteration, step.tolerance, step.file.c_str());
     if (run.History().empty()) return;
-    std::printf("\n%-30s %16s  %s\n", "stage/step", "factor", "pretension");
-    for (const T_ULF_ITER_ROW& row : run.History().back().rows)
-        std::printf("%-30s %16.9g  %s\n", row.place.c_str(), row.factor + 0.0,
-                    row.pretension ? "yes" : "no");
+    const std::vector<double> applied = UlfIterApplied(run.History());
+    std::printf("\n%-30s %-16s %16s %16s  %s\n", "stage/step", "load case", "factor", "applied",
+                "pretension");
+    const std::vector<T_ULF_ITER_ROW>& rows = run.History().back().rows;
+    for (std::size_t i = 0; i < rows.size(); ++i)
+        std::printf("%-30s %-16s %16.9g %16.9g  %s\n", rows[i].place.c_str(), rows[i].load.c_str(),
+                    rows[i].factor + 0.0, applied[i], rows[i].pretension ? "yes" : "no");
 }
 
 EXIT_CODE CheckOptions(const T_ITERATE_OPTIONS& o)
@@ -179,7 +195,7 @@ EXIT_CODE RunUlfIterate(const T_ITERATE_OPTIONS& o)
     if (!settings || !settings->Set({o.iterations, o.tolerance}))
         return Complain(EXIT_CODE::Usage, "the settings of the iteration were refused");
     CUlfIteration run(host, settings->Settings());
-    run.m_progress = ShowProgress;
+    run.m_progress = CProgressLine();
     const T_INTERRUPT interrupt;
     const int done = dialog.OnIterate(run);
     if (isatty(STDERR_FILENO) && run.History().size() > 1) std::fprintf(stderr, "\n");

@@ -167,8 +167,8 @@ std::vector<T_ULF_ITER_ROW> CUnknownStageItemDlg::SolvedRows() const
     std::vector<T_ULF_ITER_ROW> rows;
     for (std::size_t i = 0; Result() && i < LastRun()->formed.unknowns.size(); ++i) {
         const std::size_t row = RowOfUnknown(i);
-        rows.push_back(
-            {CellText(row, Stage), LastRun()->answer.factors[i], m_rows[row].pretension});
+        rows.push_back({CellText(row, Stage), LastRun()->answer.factors[i], m_rows[row].pretension,
+                        CellText(row, LoadCase)});
     }
     return rows;
 }
