@@ -226,7 +226,7 @@ TEST_F(Iterate, PictureHasTitleAxesAndLegend)
     const std::string text = ReadText(svg);
     for (const char* piece :
          {"Iterative analysis for pretension: STAY", ">Iteration<", "Factor, tolerance (-)",
-          ">Tolerance<", ">Factor 1, S1/First Step<", "convergence tolerance"})
+          ">Tolerance<", ">Factor 1, S1/First Step T<", "convergence tolerance"})
         EXPECT_NE(std::string::npos, text.find(piece)) << piece;
 }
 #endif

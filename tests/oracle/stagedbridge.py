@@ -105,7 +105,8 @@ def example():
         "unknown": [{"stage": where[s], "case": f"T{s}", "pretension": True, "load_group": 2}
                     for s in STAYS],
         "known": [{"stage": "finished", "step": "last", "case": "DEAD", "load_group": 0},
-                  {"stage": "finished", "step": "last", "case": "TRAVELLER 5 7", "load_group": 1}],
+                  *({"stage": "finished", "step": "last", "case": c["name"], "load_group": 2}
+                    for c in crane.values())],
         "constraints": [c["name"] for c in case["ulf_constraints"]]}]
     return case
 
