@@ -20,6 +20,7 @@ struct T_SHOWN {
     std::vector<T_SHOWN_CASE> cases;
     std::vector<T_CASE_RESULTS> results;
     std::vector<T_MODE_RESULTS> modes;
+    std::vector<T_SHOWN_STAGE> stages;
 };
 
 /// Shows how far a long run is, where somebody looks at it.
@@ -36,6 +37,11 @@ EXIT_CODE ReadShown(CDBDoc& doc, const T_ANALYSE_OPTIONS& o, T_SHOWN& shown)
     for (const T_SHOWN_CASE& c : shown.cases) {
         std::string error;
         if (!ReadCaseResults(doc, c, shown.results.emplace_back(), error))
+            return Complain(EXIT_CODE::BadInput, o.file + ": " + error);
+    }
+    for (T_SHOWN_STAGE& stage : shown.stages) {
+        std::string error;
+        if (!ReadStageResults(doc, stage.choice, stage.results, error))
             return Complain(EXIT_CODE::BadInput, o.file + ": " + error);
     }
     if (o.modes > 0) shown.modes = ReadModes(doc);
@@ -78,6 +84,13 @@ void PrintShown(const T_ANALYSE_OPTIONS& o, const T_SHOWN& shown, const T_UNITS&
                                         : CaseSummary(shown.cases[i], shown.results[i], units);
         std::fwrite(text.data(), 1, text.size(), stdout);
     }
+    for (const T_SHOWN_STAGE& stage : shown.stages) {
+        const T_SHOWN_CASE titled{StageTitle(stage), {}};
+        const std::string text = tables && !o.stage.empty()
+                                     ? CaseTables(titled, stage.results, units)
+                                     : CaseSummary(titled, stage.results, units);
+        std::fwrite(text.data(), 1, text.size(), stdout);
+    }
     if (!shown.modes.empty()) std::printf("%s", ModeTable(shown.modes).c_str());
 }
 
@@ -92,10 +105,10 @@ EXIT_CODE Store(CDBDoc& doc, const T_ANALYSE_OPTIONS& o)
 
 } // namespace
 
-EXIT_CODE Analyse(CDBDoc& doc, const std::vector<int>& cases, int modes)
+EXIT_CODE Analyse(CDBDoc& doc, const std::vector<int>& cases, int modes, bool noneForEmpty)
 {
     T_ANALYSIS_OPTIONS options;
-    options.allCases = cases.empty();
+    options.allCases = cases.empty() && !noneForEmpty;
     options.cases = cases;
     options.modes = modes;
     if (isatty(STDERR_FILENO)) options.progress = ShowProgress;
@@ -112,18 +125,23 @@ EXIT_CODE RunAnalyse(const T_ANALYSE_OPTIONS& o)
     T_SHOWN shown;
     std::string error;
     std::vector<int> keys;
+    const bool stageAlone = o.cases.empty() && !o.stage.empty();
     const bool modesAlone = o.cases.empty() && o.modes > 0 && doc.Data().Model().loadCases.empty();
-    if (!modesAlone && !FindShownCases(doc, o.cases, shown.cases, error))
+    if (!FindShownStages(doc, o.stage, o.step, o.load, shown.stages, error))
+        return Complain(EXIT_CODE::Usage, o.file + ": " + error);
+    if (!modesAlone && !stageAlone && !FindShownCases(doc, o.cases, shown.cases, error))
         return Complain(o.cases.empty() ? EXIT_CODE::BadInput : EXIT_CODE::Usage,
                         o.file + ": " + error);
     if (!LoadCasesOf(doc, shown.cases, keys, error))
         return Complain(EXIT_CODE::BadInput, o.file + ": " + error);
-    if (const EXIT_CODE code = Analyse(doc, keys, o.modes); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = Analyse(doc, keys, o.modes, stageAlone); code != EXIT_CODE::Done)
+        return code;
     if (const EXIT_CODE code = ReadShown(doc, o, shown); code != EXIT_CODE::Done) return code;
     if (o.json != "-") PrintShown(o, shown, doc.Unit().Units());
     EXIT_CODE code = EXIT_CODE::Done;
     if (!o.json.empty())
-        code = WriteOutput(o.json, AnalysisJson(shown.cases, shown.results, shown.modes));
+        code = WriteOutput(o.json,
+                           AnalysisJson(shown.cases, shown.results, shown.modes, shown.stages));
 #ifdef QM_UI
     if (code == EXIT_CODE::Done && !o.plot.empty()) code = DrawShape(doc, o, shown);
 #endif

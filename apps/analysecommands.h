@@ -11,6 +11,9 @@ struct T_ANALYSE_OPTIONS {
     std::string file;
     std::vector<std::string> cases; // load cases and combinations to show; empty: all load cases
     int modes = 0;                  // eigen modes to find
+    std::string stage;              // construction stage to show alone; empty: all, in brief
+    int step = kStageLastStep;      // of the stage
+    std::string load = "sum";       // of the stages: sum, dead, erection or a load case
     std::string json;               // file, or "-" for standard output
     bool table = false;             // tables also when the results go to a JSON file
     std::string plot;               // deformed shape: .svg, .png or .pdf
@@ -24,6 +27,6 @@ struct T_ANALYSE_OPTIONS {
 /// asked for, and keeps the results in a model file.
 EXIT_CODE RunAnalyse(const T_ANALYSE_OPTIONS& options);
 
-/// Linear analysis of these load cases (keys; empty: all), with progress on a terminal. Done, or
-/// the code to exit with after one line on stderr.
-EXIT_CODE Analyse(CDBDoc& doc, const std::vector<int>& cases, int modes);
+/// Linear analysis of these load cases (keys; empty: all, or none) and of the stages, with progress
+/// on a terminal. Done, or the code to exit with after one line on stderr.
+EXIT_CODE Analyse(CDBDoc& doc, const std::vector<int>& cases, int modes, bool noneForEmpty = false);

@@ -26,37 +26,50 @@ std::set<int> HeldNodes(const T_MODEL& model)
     return held;
 }
 
-bool ReadNodes(CDBDoc& doc, T_CASE_RESULTS& out)
+/// Results of load cases and of construction stages are read by the same steps.
+struct T_GETTERS {
+    int (CPostCtrl::*displacement)(int, T_DOF6&);
+    int (CPostCtrl::*reaction)(int, T_DOF6&);
+    int (CPostCtrl::*truss)(int, double&);
+    int (CPostCtrl::*beam)(int, int, T_DOF6&);
+};
+constexpr T_GETTERS kStatic{&CPostCtrl::GetDispNew, &CPostCtrl::GetReacNew, &CPostCtrl::GetStrtNew,
+                            &CPostCtrl::GetStrbNew};
+constexpr T_GETTERS kStaged{&CPostCtrl::GetDspcNew, &CPostCtrl::GetReccNew, &CPostCtrl::GetStrtcNew,
+                            &CPostCtrl::GetStrbcNew};
+
+struct T_SUM_NAME {
+    std::string_view name;
+    int key;
+};
+constexpr T_SUM_NAME kSums[] = {
+    {"sum", kStageLoadSum}, {"dead", kStageLoadDead}, {"erection", kStageLoadErection}};
+
+bool ReadNode(CPostCtrl& post, const T_GETTERS& get, int id, bool isHeld, T_CASE_RESULTS& out)
 {
-    const std::set<int> held = HeldNodes(doc.Data().Model());
-    for (const auto& entry : doc.Data().Model().nodes) {
-        const int id = entry.first;
-        T_DOF6 value{};
-        if (!doc.Post().GetDispNew(id, value)) return false;
-        out.displacements.push_back({id, Tidy(value)});
-        if (!held.contains(id)) continue;
-        if (!doc.Post().GetReacNew(id, value)) return false;
-        out.reactions.push_back({id, Tidy(value)});
-    }
+    T_DOF6 value{};
+    if (!(post.*get.displacement)(id, value)) return false;
+    out.displacements.push_back({id, Tidy(value)});
+    if (!isHeld) return true;
+    if (!(post.*get.reaction)(id, value)) return false;
+    out.reactions.push_back({id, Tidy(value)});
     return true;
 }
 
-bool ReadElements(CDBDoc& doc, T_CASE_RESULTS& out)
+bool ReadElement(CPostCtrl& post, const T_GETTERS& get, const T_ELEM_D& e, T_CASE_RESULTS& out)
 {
-    for (const auto& [id, e] : doc.Data().Model().elements) {
-        if (e.kind == ELEM_KIND::Truss) {
-            double axial = 0.0;
-            if (!doc.Post().GetStrtNew(id, axial)) return false;
-            out.trusses.push_back({id, axial + 0.0});
-        }
-        if (e.kind != ELEM_KIND::Beam) continue;
-        T_BEAM_ROWS rows{};
-        for (std::size_t p = 0; p < rows.size(); ++p) {
-            if (!doc.Post().GetStrbNew(id, static_cast<int>(p), rows[p])) return false;
-            rows[p] = Tidy(rows[p]);
-        }
-        out.beams.push_back({id, rows});
+    if (e.kind == ELEM_KIND::Truss) {
+        double axial = 0.0;
+        if (!(post.*get.truss)(e.id, axial)) return false;
+        out.trusses.push_back({e.id, axial + 0.0});
     }
+    if (e.kind != ELEM_KIND::Beam) return true;
+    T_BEAM_ROWS rows{};
+    for (std::size_t p = 0; p < rows.size(); ++p) {
+        if (!(post.*get.beam)(e.id, static_cast<int>(p), rows[p])) return false;
+        rows[p] = Tidy(rows[p]);
+    }
+    out.beams.push_back({e.id, rows});
     return true;
 }
 
@@ -101,11 +114,78 @@ bool LoadCasesOf(CDBDoc& doc, const std::vector<T_SHOWN_CASE>& shown, std::vecto
 bool ReadCaseResults(CDBDoc& doc, const T_SHOWN_CASE& shown, T_CASE_RESULTS& out,
                      std::string& error)
 {
-    if (doc.Post().SelectLoadCombNew(shown.combination) && ReadNodes(doc, out) &&
-        ReadElements(doc, out))
-        return true;
-    error = doc.Post().Error();
-    return false;
+    CPostCtrl& post = doc.Post();
+    const T_MODEL& model = doc.Data().Model();
+    const std::set<int> held = HeldNodes(model);
+    const bool done = post.SelectLoadCombNew(shown.combination) &&
+                      std::ranges::all_of(model.nodes,
+                                          [&](const auto& n) {
+                                              return ReadNode(post, kStatic, n.first,
+                                                              held.contains(n.first), out);
+                                          }) &&
+                      std::ranges::all_of(model.elements, [&](const auto& e) {
+                          return ReadElement(post, kStatic, e.second, out);
+                      });
+    if (!done) error = post.Error();
+    return done;
+}
+
+bool FindShownStages(CDBDoc& doc, const std::string& stage, int step, const std::string& load,
+                     std::vector<T_SHOWN_STAGE>& out, std::string& error)
+{
+    int key = 0;
+    const auto* const sum = std::ranges::find(kSums, load, &T_SUM_NAME::name);
+    if (sum != std::end(kSums))
+        key = sum->key;
+    else if (!doc.Attr().FindStld(load, key))
+        error = "no load case named \"" + load + "\", nor is it sum, dead or erection";
+    for (const auto& [number, record] : doc.Data().Model().stages) {
+        if (!stage.empty() && record.name != stage) continue;
+        const T_STAGE_CHOICE choice{number, StageStepNumber(record, step), key};
+        if (choice.step == 0) error = "stage \"" + stage + "\" has no step " + std::to_string(step);
+        out.push_back({record.name,
+                       load,
+                       record.steps,
+                       choice,
+                       StandingElements(doc.Data().Model(), number).size(),
+                       {}});
+    }
+    if (error.empty() && out.empty() && !stage.empty())
+        error = "no construction stage named \"" + stage + "\"";
+    return error.empty();
+}
+
+std::set<int> StandingElements(const T_MODEL& model, int stage)
+{
+    std::set<int> standing;
+    for (const auto& [key, record] : model.stages) {
+        if (key > stage) break;
+        for (const int id : record.deactivate.elements)
+            standing.erase(id);
+        standing.insert(record.activate.elements.begin(), record.activate.elements.end());
+    }
+    return standing;
+}
+
+bool ReadStageResults(CDBDoc& doc, const T_STAGE_CHOICE& choice, T_CASE_RESULTS& out,
+                      std::string& error)
+{
+    CPostCtrl& post = doc.Post();
+    const T_MODEL& model = doc.Data().Model();
+    const std::set<int> elements = StandingElements(model, choice.stage), held = HeldNodes(model);
+    std::set<int> nodes;
+    for (const int id : elements)
+        for (const int node : {model.elements.at(id).nodeI, model.elements.at(id).nodeJ})
+            if (model.nodes.contains(node)) nodes.insert(node); // a spring has one node
+    post.SelectStage(choice.stage, choice.step, choice.load);
+    const bool done =
+        std::ranges::all_of(
+            nodes, [&](int id) { return ReadNode(post, kStaged, id, held.contains(id), out); }) &&
+        std::ranges::all_of(elements, [&](int id) {
+            return ReadElement(post, kStaged, model.elements.at(id), out);
+        });
+    if (!done) error = post.Error();
+    return done;
 }
 
 std::vector<T_MODE_RESULTS> ReadModes(CDBDoc& doc)

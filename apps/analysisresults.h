@@ -4,6 +4,7 @@
 #include "qm_db/dbdoc.h"
 
 #include <array>
+#include <set>
 #include <string>
 #include <vector>
 
@@ -41,6 +42,27 @@ bool LoadCasesOf(CDBDoc& doc, const std::vector<T_SHOWN_CASE>& shown, std::vecto
 /// False: `error` says why (results are missing, or older than the model).
 bool ReadCaseResults(CDBDoc& doc, const T_SHOWN_CASE& shown, T_CASE_RESULTS& out,
                      std::string& error);
+
+/// A state at the end of a step of a construction stage, with its results.
+struct T_SHOWN_STAGE {
+    std::string stage, load;  // names; "sum", "dead" and "erection" for sums
+    int steps = 1;            // of the stage
+    T_STAGE_CHOICE choice;    // the step as a number
+    std::size_t elements = 0; // that stand
+    T_CASE_RESULTS results;
+};
+
+/// Every stage for an empty name; step: a number or kStageLastStep. False: `error` names what there
+/// is none of.
+bool FindShownStages(CDBDoc& doc, const std::string& stage, int step, const std::string& load,
+                     std::vector<T_SHOWN_STAGE>& out, std::string& error);
+
+/// Ids of the elements that stand in a stage.
+std::set<int> StandingElements(const T_MODEL& model, int stage);
+
+/// What stands in a stage, of one step and load; false: `error` says why.
+bool ReadStageResults(CDBDoc& doc, const T_STAGE_CHOICE& choice, T_CASE_RESULTS& out,
+                      std::string& error);
 
 /// A mode with its values in current units.
 struct T_MODE_RESULTS {

@@ -7,6 +7,7 @@
 #include <cmath>
 #include <functional>
 #include <nlohmann/json.hpp>
+#include <utility>
 
 namespace {
 
@@ -82,6 +83,17 @@ std::string BeamList(const T_BEAM_ROWS& rows)
     for (std::size_t p = 0; p < rows.size(); ++p)
         text += (p ? ", " : "") + NumberList(rows[p]);
     return text + "]";
+}
+
+std::string StageObject(const T_SHOWN_STAGE& s)
+{
+    const T_CASE_RESULTS& r = s.results;
+    return FormatText("{\n  \"step\": %d, \"load\": ", s.choice.step) + JsonText(s.load) +
+           FormatText(", \"elements\": %zu,\n  \"displacements\": ", s.elements) +
+           IdObject(r.displacements, NumberList) +
+           ",\n  \"reactions\": " + IdObject(r.reactions, NumberList) +
+           ",\n  \"truss\": " + IdObject(r.trusses, ShortestText) +
+           ",\n  \"beam\": " + IdObject(r.beams, BeamList) + "\n  }";
 }
 
 std::string ModeObject(const T_MODE_RESULTS& mode)
@@ -213,7 +225,8 @@ std::string JsonText(const std::string& text)
 
 std::string AnalysisJson(const std::vector<T_SHOWN_CASE>& shown,
                          const std::vector<T_CASE_RESULTS>& results,
-                         const std::vector<T_MODE_RESULTS>& modes)
+                         const std::vector<T_MODE_RESULTS>& modes,
+                         const std::vector<T_SHOWN_STAGE>& stages)
 {
     std::string text = "{\n";
     text += CaseObject("displacements", shown, results, &T_CASE_RESULTS::displacements, NumberList);
@@ -223,7 +236,18 @@ std::string AnalysisJson(const std::vector<T_SHOWN_CASE>& shown,
     text += ",\n \"modes\": [";
     for (std::size_t i = 0; i < modes.size(); ++i)
         text += (i ? ",\n" : "\n") + ModeObject(modes[i]);
-    return text + (modes.empty() ? "]\n}\n" : "\n ]\n}\n");
+    text += modes.empty() ? "]" : "\n ]";
+    const char* before = ",\n \"stages\": {\n  ";
+    for (const T_SHOWN_STAGE& stage : stages)
+        text += std::exchange(before, ",\n  ") + JsonText(stage.stage) + ": " + StageObject(stage);
+    return text + (stages.empty() ? "\n}\n" : "\n }\n}\n");
+}
+
+std::string StageTitle(const T_SHOWN_STAGE& stage)
+{
+    return "stage \"" + stage.stage + "\"" +
+           FormatText(", step %d of %d, %s, %zu elements", stage.choice.step, stage.steps,
+                      stage.load.c_str(), stage.elements);
 }
 
 std::string CaseTables(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& results,

@@ -8,9 +8,15 @@
 /// Writes {"displacements": {CASE: {NODE: [6]}}, "reactions": ..., "truss": {CASE: {ELEMENT: N}},
 /// "beam": {CASE: {ELEMENT: [[6] at I, 1/4, 2/4, 3/4, J]}}, "modes": [...]}; cases in the order
 /// given, ids ascending, numbers in their shortest form.
+/// With stages also "stages": {STAGE: {"step": N, "load": LOAD, "elements": number that stand,
+/// "displacements": {NODE: [6]}, "reactions": ..., "truss": ..., "beam": ...}}, of what stands.
 std::string AnalysisJson(const std::vector<T_SHOWN_CASE>& shown,
                          const std::vector<T_CASE_RESULTS>& results,
-                         const std::vector<T_MODE_RESULTS>& modes);
+                         const std::vector<T_MODE_RESULTS>& modes,
+                         const std::vector<T_SHOWN_STAGE>& stages);
+
+/// What the tables and the summary call it: stage "S1", step 2 of 3, sum, 12 elements.
+std::string StageTitle(const T_SHOWN_STAGE& stage);
 
 /// Tables of one load case: displacements, reactions, truss and beam forces. What is below 1e-12 of
 /// the largest displacement or force is rounding and is shown as 0.

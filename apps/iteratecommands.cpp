@@ -8,11 +8,13 @@
 #include "qm_rps/ulfiterationresultdlg.h"
 #include "qm_rps/ulfstageresults.h"
 #include "qm_rps/unknownloadfactoriteranal.h"
+#include "ulfrun.h"
 
 #ifdef QM_UI
 #include "qm_ui/iterationplot.h"
 #endif
 
+#include <algorithm>
 #include <atomic>
 #include <csignal>
 #include <cstdio>
@@ -21,9 +23,9 @@
 
 namespace {
 
-std::atomic<bool> g_cancel{false}; // set by an interrupt, read between iterations
+std::atomic<bool> g_cancel{false}; // set by an interrupt
 
-/// While it lives, an interrupt ends the run after the iteration at hand.
+/// While it lives, an interrupt ends the run; the iteration at hand is taken back.
 struct T_INTERRUPT {
     T_INTERRUPT() : before(std::signal(SIGINT, [](int) { g_cancel = true; })) {}
     ~T_INTERRUPT() { std::signal(SIGINT, before); }
@@ -50,14 +52,22 @@ private:
     bool m_overwrite;
 };
 
-bool ShowProgress(int done, int required)
-{
-    if (isatty(STDERR_FILENO)) {
-        std::fprintf(stderr, "\rqm-rps: %d of at most %d iterations done", done, required);
-        std::fflush(stderr);
+/// A line on a terminal that changes with each iteration.
+class CProgressLine {
+public:
+    bool operator()(int done, int required)
+    {
+        if (done != m_shown && isatty(STDERR_FILENO)) {
+            std::fprintf(stderr, "\rqm-rps: %d of at most %d iterations done", done, required);
+            std::fflush(stderr);
+        }
+        m_shown = done;
+        return !g_cancel;
     }
-    return !g_cancel;
-}
+
+private:
+    int m_shown = -1;
+};
 
 struct T_END_WORDS {
     ULF_ITER_END end;
@@ -76,8 +86,11 @@ constexpr T_END_WORDS kEnds[] = {
     {ULF_ITER_END::NotAnalysed, "not analysed", EXIT_CODE::BadInput},
 };
 
-T_END_WORDS WordsOf(const CUlfIteration& run, const T_ITERATE_OPTIONS& o)
+T_END_WORDS WordsOf(const CUlfIteration& run, const T_ITERATE_OPTIONS& o, bool met)
 {
+    const bool done = run.End() == ULF_ITER_END::Required ? o.iterations == 0
+                                                          : run.End() == ULF_ITER_END::Converged;
+    if (done && !met) return {run.End(), "constraints not met", EXIT_CODE::NotFound};
     if (run.End() == ULF_ITER_END::Required && o.iterations == 0)
         return {run.End(), "solved", EXIT_CODE::Done};
     for (const T_END_WORDS& words : kEnds)
@@ -92,6 +105,7 @@ std::string StepJson(const T_ULF_ITER_STEP& step)
                        ", \"factors\": [";
     for (std::size_t i = 0; i < step.rows.size(); ++i)
         text += std::string(i ? ", " : "") + "{\"place\": " + JsonText(step.rows[i].place) +
+                ", \"case\": " + JsonText(step.rows[i].load) +
                 ", \"factor\": " + ShortestText(step.rows[i].factor + 0.0) +
                 ", \"pretension\": " + (step.rows[i].pretension ? "true" : "false") + "}";
     return text + "]}";
@@ -103,7 +117,11 @@ std::string HistoryJson(const CUlfIteration& run, const char* status)
                        ",\n \"report\": " + JsonText(run.ReportPath()) + ",\n \"history\": [";
     for (const T_ULF_ITER_STEP& step : run.History())
         text += (step.iteration ? ",\n  " : "\n  ") + StepJson(step);
-    return text + "\n ]\n}\n";
+    text += "\n ],\n \"applied\": [";
+    const std::vector<double> applied = UlfIterApplied(run.History());
+    for (std::size_t i = 0; i < applied.size(); ++i)
+        text += (i ? ", " : "") + ShortestText(applied[i]);
+    return text + "]\n}\n";
 }
 
 void PrintHistory(const CUlfIteration& run)
@@ -112,10 +130,13 @@ void PrintHistory(const CUlfIteration& run)
     for (const T_ULF_ITER_STEP& step : run.History())
         std::printf("%9d %14.6g  %s\n", step.iteration, step.tolerance, step.file.c_str());
     if (run.History().empty()) return;
-    std::printf("\n%-30s %16s  %s\n", "stage/step", "factor", "pretension");
-    for (const T_ULF_ITER_ROW& row : run.History().back().rows)
-        std::printf("%-30s %16.9g  %s\n", row.place.c_str(), row.factor + 0.0,
-                    row.pretension ? "yes" : "no");
+    const std::vector<double> applied = UlfIterApplied(run.History());
+    std::printf("\n%-30s %-16s %16s %16s  %s\n", "stage/step", "load case", "factor", "applied",
+                "pretension");
+    const std::vector<T_ULF_ITER_ROW>& rows = run.History().back().rows;
+    for (std::size_t i = 0; i < rows.size(); ++i)
+        std::printf("%-30s %-16s %16.9g %16.9g  %s\n", rows[i].place.c_str(), rows[i].load.c_str(),
+                    rows[i].factor + 0.0, applied[i], rows[i].pretension ? "yes" : "no");
 }
 
 EXIT_CODE CheckOptions(const T_ITERATE_OPTIONS& o)
@@ -132,15 +153,6 @@ EXIT_CODE CheckOptions(const T_ITERATE_OPTIONS& o)
         return Complain(EXIT_CODE::NoAccess,
                         report + ": the report is there already; say --overwrite or --append");
     return EXIT_CODE::Done;
-}
-
-EXIT_CODE AnalyseStages(CDBDoc& doc, const std::string& file)
-{
-    T_ANALYSIS_OPTIONS options;
-    options.allCases = false;
-    T_ANALYSIS_ERROR error;
-    if (doc.RunAnalysis(options, error)) return EXIT_CODE::Done;
-    return Complain(EXIT_CODE::BadInput, file + ": " + error.text);
 }
 
 EXIT_CODE WriteResults(const CUlfIteration& run, const T_ITERATE_OPTIONS& o, const char* status)
@@ -171,6 +183,7 @@ EXIT_CODE RunUlfIterate(const T_ITERATE_OPTIONS& o)
                         o.file + ": no construction-stage item named \"" + o.item + "\"");
     CUlfStageResults results(doc);
     CUnknownStageItemDlg dialog(doc, results, key);
+    dialog.m_sumStageLoads = o.sumStageLoads;
     if (const auto findings = dialog.Findings(); !findings.empty())
         return Complain(EXIT_CODE::BadInput, o.file + ": " + findings.front().text);
     if (const EXIT_CODE code = AnalyseStages(doc, o.file); code != EXIT_CODE::Done) return code;
@@ -182,11 +195,13 @@ EXIT_CODE RunUlfIterate(const T_ITERATE_OPTIONS& o)
     if (!settings || !settings->Set({o.iterations, o.tolerance}))
         return Complain(EXIT_CODE::Usage, "the settings of the iteration were refused");
     CUlfIteration run(host, settings->Settings());
-    run.m_progress = ShowProgress;
+    run.m_progress = CProgressLine();
     const T_INTERRUPT interrupt;
     const int done = dialog.OnIterate(run);
     if (isatty(STDERR_FILENO) && run.History().size() > 1) std::fprintf(stderr, "\n");
-    const T_END_WORDS words = WordsOf(run, o);
+    const auto& result = dialog.Result();
+    const bool met = result && std::ranges::all_of(UlfResultRows(*result), &T_ULF_RESULT_ROW::met);
+    const T_END_WORDS words = WordsOf(run, o, met);
     const std::string reason = host.Error().empty() ? view.m_message : host.Error();
     if (!done || words.code != EXIT_CODE::Done)
         Complain(words.code, o.file + ": " + words.status + (reason.empty() ? "" : ": " + reason));

@@ -6,12 +6,20 @@
 
 void AddAnalyse(CLI::App& app, EXIT_CODE& code)
 {
-    auto* sub = app.add_subcommand("analyse", "Linear analysis of load cases, and modes");
+    auto* sub =
+        app.add_subcommand("analyse", "Analysis of load cases, construction stages and modes");
     auto o = std::make_shared<T_ANALYSE_OPTIONS>();
     sub->add_option("FILE", o->file, "Model file (.qmdb) or case file (.json)")->required();
     sub->add_option("--case", o->cases, "Load case or combination to show (default: all cases)");
     sub->add_option("--modes", o->modes, "Number of eigen modes to find")
         ->check(CLI::Range(1, 1000000));
+    auto* stage = sub->add_option("--stage", o->stage,
+                                  "Construction stage to show alone (default: all, in brief)");
+    sub->add_option("--step", o->step, "Step of the stage (default: the last one)")
+        ->check(CLI::Range(1, 1000000))
+        ->needs(stage);
+    sub->add_option("--load", o->load,
+                    "Of the stages: sum, dead, erection or a load case (default: sum)");
     sub->add_option("--json", o->json, "Write the results as JSON; - for standard output");
     sub->add_flag("--table", o->table, "Print the tables also when the JSON goes to a file");
     sub->add_option("--plot", o->plot, "Draw the deformed shape: .svg, .png or .pdf");

@@ -27,6 +27,13 @@ void AddItem(CLI::App* sub, const OPTIONS& o, bool required)
     if (required) option->required();
 }
 
+void AddSum(CLI::App* sub, bool& sumStageLoads)
+{
+    sub->add_flag(
+        "--sum-stage-loads", sumStageLoads,
+        "Load groups 0 and 1 of a construction-stage item read the sum of all stage loads");
+}
+
 void AddSolve(CLI::App* ulf, const OPTIONS& o, EXIT_CODE& code)
 {
     auto* solve = AddOne(ulf, "solve", "Find the factors", " --item LEVEL --plot bars.svg", o,
@@ -34,6 +41,7 @@ void AddSolve(CLI::App* ulf, const OPTIONS& o, EXIT_CODE& code)
     AddItem(solve, o, true);
     solve->add_option("--json", o->json, "Write the result as JSON; - for standard output");
     solve->add_option("--plot", o->plot, "Draw the constraints against their bounds");
+    AddSum(solve, o->sumStageLoads);
     solve->add_option("--shape-plot", o->shapePlot, "Draw the displacements before and after");
 }
 
@@ -51,6 +59,7 @@ void AddIterate(CLI::App* ulf, EXIT_CODE& code)
     sub->add_flag("--append", o->append, "Add to it");
     sub->add_option("--json", o->json, "Write the history as JSON; - for standard output");
     sub->add_option("--plot", o->plot, "Draw factors and tolerance by iteration");
+    AddSum(sub, o->sumStageLoads);
     sub->footer("Example:\n  qm-rps ulf iterate bridge.qmdb --item STAYS --tolerance 1e-6");
     sub->callback([=, &code] { code = RunUlfIterate(*o); });
 }
@@ -72,9 +81,11 @@ void AddUlf(CLI::App& app, EXIT_CODE& code)
                            " --item \"NO UPLIFT\"", o, RunUlfExplain, code);
     AddItem(explain, o, true);
     explain->add_option("--json", o->json, "Write it as JSON; - for standard output");
+    AddSum(explain, o->sumStageLoads);
     auto* sheet = AddOne(ulf, "export", "Write the spreadsheet with the influence matrix",
                          " --item LEVEL -o level.xlsx", o, RunUlfExport, code);
     AddItem(sheet, o, true);
+    AddSum(sheet, o->sumStageLoads);
     sheet->add_option("-o", o->out, "Spreadsheet to write (.xlsx)")->required();
     sheet->add_option("--date", o->date, "Date in the sheet, YYYY-MM-DD (default: today)");
     sheet->add_option("--sheet-version", o->sheetVersion, "Version of the spreadsheet program")

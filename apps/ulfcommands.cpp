@@ -1,12 +1,16 @@
 #include "ulfcommands.h"
 
-#include "analysecommands.h"
 #include "inputfile.h"
 #include "output.h"
 #include "qm_base/messagehistory.h"
+#include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/ulfstageplace.h"
+#include "qm_rps/ulfstageresults.h"
 #include "qm_rps/ulftexts.h"
+#include "qm_rps/unknownloadfactoritemdlg.h"
 #include "qm_rps/unknownloadfactorresultdlg.h"
+#include "qm_rps/unknownstageitemdlg.h"
 #include "ulfrun.h"
 
 #ifdef QM_UI
@@ -14,45 +18,30 @@
 #include "qm_ui/ulfplot.h"
 #endif
 
+#include <algorithm>
 #include <cstdio>
 #include <ctime>
 #include <filesystem>
-#include <memory>
 #include <unistd.h>
+
+using zql::lib::MMSGFunction;
 
 namespace {
 
-/// A document with one of its items, ready to be calculated.
-struct T_OPENED {
-    CDBDoc doc;
-    std::unique_ptr<CUnknownLoadFactorItemDlg> dialog;
-};
-
-/// A case file is analysed in memory: the load cases of the item's combination.
-EXIT_CODE PrepareResults(T_OPENED& in, const std::string& file)
+EXIT_CODE OpenItem(const T_ULF_OPTIONS& o, T_ULF_OPENED& in)
 {
-    if (IsModelFile(file) || !in.dialog->Findings().empty()) return EXIT_CODE::Done;
-    std::vector<int> keys;
-    for (const T_ULF_CASE& c : in.dialog->Cases())
-        keys.push_back(c.key);
-    return Analyse(in.doc, keys, 0);
+    return OpenUlfItem(o.file, o.item, o.sumStageLoads, in);
 }
 
-EXIT_CODE OpenItem(const T_ULF_OPTIONS& o, T_OPENED& in)
+EXIT_CODE OpenAndAnalyse(const T_ULF_OPTIONS& o, T_ULF_OPENED& in)
 {
-    if (const EXIT_CODE code = OpenInput(in.doc, o.file); code != EXIT_CODE::Done) return code;
-    int key = 0;
-    if (!in.doc.Attr().FindUlfi(o.item, key))
-        return Complain(EXIT_CODE::Usage,
-                        o.file + ": no unknown load factor item named \"" + o.item + "\"");
-    in.dialog = std::make_unique<CUnknownLoadFactorItemDlg>(in.doc, key);
-    return PrepareResults(in, o.file);
+    const EXIT_CODE code = OpenItem(o, in);
+    return code == EXIT_CODE::Done ? AnalyseForUlf(o.file, in) : code;
 }
 
-/// Opens and solves; a refusal or a missing solution is told on stderr.
-EXIT_CODE OpenAndSolve(const T_ULF_OPTIONS& o, T_OPENED& in)
+/// Solves; a refusal or a missing solution is told on stderr.
+EXIT_CODE SolveOpened(const T_ULF_OPTIONS& o, T_ULF_OPENED& in)
 {
-    if (const EXIT_CODE code = OpenItem(o, in); code != EXIT_CODE::Done) return code;
     const T_ULF_OUTCOME outcome = SolveUlf(*in.dialog);
     if (outcome.code != EXIT_CODE::Done) Complain(outcome.code, o.file + ": " + outcome.message);
     return in.dialog->Result() ? EXIT_CODE::Done : outcome.code;
@@ -71,8 +60,9 @@ T_ULF_PICTURE PictureOf(CDBDoc& doc, const T_ULF_RESULT& r)
     picture.subtitle = std::string(r.exact ? "solved as equations" : "optimized") + ", " +
                        doc.Data().Model().styp.title;
     for (const T_ULF_RESULT_ROW& row : UlfResultRows(r))
-        picture.bars.push_back({row.name, UlfUnit(doc, row.name), row.value, row.upper, row.lower,
-                                row.active, !row.met, UlfScale(r, picture.bars.size())});
+        picture.bars.push_back({UlfNameAt(row.name, row.place), UlfUnit(doc, row.name), row.value,
+                                row.upper, row.lower, row.active, !row.met,
+                                UlfScale(r, picture.bars.size())});
     for (std::size_t i = 0; i < r.cases.size(); ++i)
         picture.notes.push_back(FactorNote(r.cases[i], r.factors[i]));
     return picture;
@@ -140,6 +130,26 @@ bool SetDate(const std::string& text, T_ULF_SHEET_SETTINGS& settings)
            settings.month >= 1 && settings.month <= 12 && settings.day >= 1 && settings.day <= 31;
 }
 
+void ListItem(CDBDoc& doc, int key, const T_ULFI_D& item)
+{
+    const auto& combinations = doc.Data().Model().combinations;
+    const auto it = combinations.find(item.combination);
+    std::printf("%s: combination %s, %zu of %zu load cases unknown, %zu constraints%s\n",
+                item.name.c_str(), it == combinations.end() ? "-" : it->second.name.c_str(),
+                item.unknowns.size(), CUnknownLoadFactorItemDlg(doc, key).Cases().size(),
+                item.constraints.size(), item.solveByEquations ? ", solved as equations" : "");
+}
+
+void ListStageItem(const T_ULSI_D& item)
+{
+    const auto unknown = std::ranges::count_if(item.rows, &T_ULSI_ROW::unknown);
+    const auto scaling = std::ranges::count_if(item.rows, &T_ULSI_ROW::pretension);
+    std::printf("%s: construction stages, %td of %zu loads unknown (%td scale pretension), "
+                "%zu constraints%s\n",
+                item.name.c_str(), unknown, item.rows.size(), scaling, item.constraints.size(),
+                item.solveByEquations ? ", solved as equations" : "");
+}
+
 EXIT_CODE LastMessage(const zql::frx::MDialog& dialog, EXIT_CODE code, const std::string& file)
 {
     const auto& messages = dialog.Messages();
@@ -153,24 +163,18 @@ EXIT_CODE RunUlfList(const T_ULF_OPTIONS& o)
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     const T_MODEL& model = doc.Data().Model();
-    for (const auto& entry : model.ulfItems) {
-        const CUnknownLoadFactorItemDlg dialog(doc, entry.first);
-        const T_LCOM_D* combination = nullptr;
-        if (const auto it = model.combinations.find(entry.second.combination);
-            it != model.combinations.end())
-            combination = &it->second;
-        std::printf("%s: combination %s, %zu of %zu load cases unknown, %zu constraints%s\n",
-                    entry.second.name.c_str(), combination ? combination->name.c_str() : "-",
-                    entry.second.unknowns.size(), dialog.Cases().size(),
-                    entry.second.constraints.size(),
-                    entry.second.solveByEquations ? ", solved as equations" : "");
-    }
+    for (const auto& [key, item] : model.ulfItems)
+        ListItem(doc, key, item);
+    for (const auto& entry : model.ulfStageItems)
+        ListStageItem(entry.second);
     for (const auto& entry : model.ulfConstraints) {
         T_ULFC_D c;
-        if (doc.Attr().GetUlfc(entry.first, c))
-            std::printf("  %s: %s\n", c.name.c_str(), UlfDescription(c).c_str());
+        if (!doc.Attr().GetUlfc(entry.first, c)) continue;
+        const std::string place = UlfPlaceText(doc.Data(), c.stage, c.step);
+        std::printf("  %s: %s\n", UlfNameAt(c.name, place).c_str(), UlfDescription(c).c_str());
     }
-    std::printf("%zu items, %zu constraints\n", model.ulfItems.size(), model.ulfConstraints.size());
+    std::printf("%zu items, %zu constraints\n", model.ulfItems.size() + model.ulfStageItems.size(),
+                model.ulfConstraints.size());
     return EXIT_CODE::Done;
 }
 
@@ -179,14 +183,19 @@ EXIT_CODE RunUlfCheck(const T_ULF_OPTIONS& o)
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     std::size_t items = 0, findings = 0;
-    for (const auto& entry : doc.Data().Model().ulfItems) {
-        if (!o.item.empty() && entry.second.name != o.item) continue;
+    const auto check = [&](const std::string& name, const CUlfItemDialog& dialog) {
+        if (!o.item.empty() && name != o.item) return;
         ++items;
-        for (const T_FINDING& f : CUnknownLoadFactorItemDlg(doc, entry.first).Findings()) {
-            std::printf("%s: %s: %s\n", entry.second.name.c_str(), f.field.c_str(), f.text.c_str());
+        for (const T_FINDING& f : dialog.Findings()) {
+            std::printf("%s: %s: %s\n", name.c_str(), f.field.c_str(), f.text.c_str());
             ++findings;
         }
-    }
+    };
+    for (const auto& [key, item] : doc.Data().Model().ulfItems)
+        check(item.name, CUnknownLoadFactorItemDlg(doc, key));
+    CUlfStageResults results(doc);
+    for (const auto& [key, item] : doc.Data().Model().ulfStageItems)
+        check(item.name, CUnknownStageItemDlg(doc, results, key));
     if (items == 0 && !o.item.empty())
         return Complain(EXIT_CODE::Usage,
                         o.file + ": no unknown load factor item named \"" + o.item + "\"");
@@ -199,8 +208,12 @@ EXIT_CODE RunUlfSolve(const T_ULF_OPTIONS& o)
     for (const std::string& path : {o.plot, o.shapePlot}) {
         if (const EXIT_CODE code = CheckPlotName(path); code != EXIT_CODE::Done) return code;
     }
-    T_OPENED in;
+    T_ULF_OPENED in;
     if (const EXIT_CODE code = OpenItem(o, in); code != EXIT_CODE::Done) return code;
+    if (in.stage && !o.shapePlot.empty())
+        return Complain(EXIT_CODE::Usage, "--shape-plot draws static load cases; the loads of " +
+                                              o.item + " act at construction stages");
+    if (const EXIT_CODE code = AnalyseForUlf(o.file, in); code != EXIT_CODE::Done) return code;
     const T_ULF_OUTCOME outcome = SolveUlf(*in.dialog);
     const auto& result = in.dialog->Result();
     if (outcome.code != EXIT_CODE::Done) Complain(outcome.code, o.file + ": " + outcome.message);
@@ -216,8 +229,8 @@ EXIT_CODE RunUlfSolve(const T_ULF_OPTIONS& o)
 
 EXIT_CODE RunUlfExplain(const T_ULF_OPTIONS& o)
 {
-    T_OPENED in;
-    if (const EXIT_CODE code = OpenItem(o, in); code != EXIT_CODE::Done) return code;
+    T_ULF_OPENED in;
+    if (const EXIT_CODE code = OpenAndAnalyse(o, in); code != EXIT_CODE::Done) return code;
     const T_ULF_OUTCOME outcome = SolveUlf(*in.dialog);
     T_ULF_EXPLAINED explained;
     const auto& run = in.dialog->LastRun();
@@ -241,8 +254,9 @@ EXIT_CODE RunUlfExport(const T_ULF_OPTIONS& o)
     settings.fileName = std::filesystem::path(o.file).filename().string();
     if (!SetDate(o.date, settings))
         return Complain(EXIT_CODE::Usage, o.date + ": a date is YYYY-MM-DD");
-    T_OPENED in;
-    if (const EXIT_CODE code = OpenAndSolve(o, in); code != EXIT_CODE::Done) return code;
+    T_ULF_OPENED in;
+    if (const EXIT_CODE code = OpenAndAnalyse(o, in); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = SolveOpened(o, in); code != EXIT_CODE::Done) return code;
     CUnknownLoadFactorResultDlg dialog(in.doc, *in.dialog->Result());
     if (!dialog.OnExport(o.out, settings)) {
         const bool fits = UlfSheetFits(dialog.Result().constraints.size(), o.sheetVersion);
@@ -255,11 +269,17 @@ EXIT_CODE RunUlfExport(const T_ULF_OPTIONS& o)
 
 EXIT_CODE RunUlfCombine(const T_ULF_OPTIONS& o)
 {
+    T_ULF_OPENED in;
+    if (const EXIT_CODE code = OpenItem(o, in); code != EXIT_CODE::Done) return code;
+    if (in.stage)
+        return Complain(EXIT_CODE::Usage,
+                        o.file + ": " +
+                            MMSGFunction::Format("IDS_QM_ULSI_NO_COMBINATION", {o.item}));
     if (o.out.empty() && !IsModelFile(o.file))
         return Complain(EXIT_CODE::Usage, o.file + ": a case file is not changed; name another "
                                                    "file with -o");
-    T_OPENED in;
-    if (const EXIT_CODE code = OpenAndSolve(o, in); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = AnalyseForUlf(o.file, in); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = SolveOpened(o, in); code != EXIT_CODE::Done) return code;
     CUnknownLoadFactorResultDlg dialog(in.doc, *in.dialog->Result());
     dialog.m_combinationName = o.name;
     (void)TakeMessageHistory(); // what the calculation has left

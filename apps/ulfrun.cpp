@@ -1,9 +1,15 @@
 #include "ulfrun.h"
 
+#include "analysecommands.h"
 #include "analysistext.h"
+#include "inputfile.h"
+#include "output.h"
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/ulfchecks.h"
+#include "qm_rps/ulfstageresults.h"
+#include "qm_rps/unknownloadfactoritemdlg.h"
+#include "qm_rps/unknownstageitemdlg.h"
 
 #include <algorithm>
 #include <array>
@@ -49,6 +55,7 @@ std::string ConstraintsJson(const T_ULF_RESULT& r)
     std::string text = "[";
     for (const T_ULF_RESULT_ROW& row : UlfResultRows(r))
         text += (text.size() > 1 ? ",\n  {" : "\n  {") + ("\"name\": " + JsonText(row.name)) +
+                (row.place.empty() ? "" : ", \"place\": " + JsonText(row.place)) +
                 ", \"value\": " + ShortestText(row.value + 0.0) +
                 ", \"upper\": " + NumberOrNull(row.upper) +
                 ", \"lower\": " + NumberOrNull(row.lower) +
@@ -85,7 +92,55 @@ int Widest(const ROWS& rows, int least, const F& text)
 
 } // namespace
 
-T_ULF_OUTCOME SolveUlf(CUnknownLoadFactorItemDlg& dialog)
+T_ULF_OPENED::T_ULF_OPENED() = default;
+T_ULF_OPENED::~T_ULF_OPENED() = default;
+
+EXIT_CODE OpenUlfItem(const std::string& file, const std::string& item, bool sumStageLoads,
+                      T_ULF_OPENED& out)
+{
+    if (const EXIT_CODE code = OpenInput(out.doc, file); code != EXIT_CODE::Done) return code;
+    int key = 0, stageKey = 0;
+    const bool isStatic = out.doc.Attr().FindUlfi(item, key) != 0;
+    out.stage = out.doc.Attr().FindUlsi(item, stageKey) != 0;
+    const std::string quoted = "\"" + item + "\"";
+    if (isStatic && out.stage)
+        return Complain(EXIT_CODE::BadInput,
+                        file + ": " + quoted +
+                            " names a static item and one of construction stages; give one of "
+                            "them another name");
+    if (out.stage) {
+        out.results = std::make_unique<CUlfStageResults>(out.doc);
+        auto dialog = std::make_unique<CUnknownStageItemDlg>(out.doc, *out.results, stageKey);
+        dialog->m_sumStageLoads = sumStageLoads;
+        out.dialog = std::move(dialog);
+    } else if (isStatic) {
+        auto dialog = std::make_unique<CUnknownLoadFactorItemDlg>(out.doc, key);
+        for (const T_ULF_CASE& loadCase : dialog->Cases())
+            out.cases.push_back(loadCase.key);
+        out.dialog = std::move(dialog);
+    } else {
+        return Complain(EXIT_CODE::Usage, file + ": no unknown load factor item named " + quoted);
+    }
+    return EXIT_CODE::Done;
+}
+
+EXIT_CODE AnalyseForUlf(const std::string& file, T_ULF_OPENED& in)
+{
+    if ((!in.stage && IsModelFile(file)) || !in.dialog->Findings().empty()) return EXIT_CODE::Done;
+    return in.stage ? AnalyseStages(in.doc, file) : Analyse(in.doc, in.cases, 0);
+}
+
+EXIT_CODE AnalyseStages(CDBDoc& doc, const std::string& file)
+{
+    if (doc.Post().CheckStagedResult()) return EXIT_CODE::Done;
+    T_ANALYSIS_OPTIONS options;
+    options.allCases = false;
+    T_ANALYSIS_ERROR error;
+    if (doc.RunAnalysis(options, error)) return EXIT_CODE::Done;
+    return Complain(EXIT_CODE::BadInput, file + ": " + error.text);
+}
+
+T_ULF_OUTCOME SolveUlf(CUlfItemDialog& dialog)
 {
     T_ULF_OUTCOME out;
     const bool solved = dialog.OnCalculate();
@@ -153,20 +208,23 @@ std::string ExplainJson(const T_ULF_EXPLAINED& e)
 
 std::string UlfTables(const T_ULF_RESULT& r)
 {
-    const int caseWidth = Widest(r.cases, 10, [](const T_ULF_CASE& c) { return c.name; });
-    std::string text = FormatText("%-*s %9s %16s\n", caseWidth, "load case", "", "factor");
+    const int caseWidth =
+        Widest(r.cases, r.stage ? 15 : 10, [](const T_ULF_CASE& c) { return c.name; });
+    std::string text = FormatText("%-*s %9s %16s\n", caseWidth,
+                                  r.stage ? "stage/step case" : "load case", "", "factor");
     for (std::size_t i = 0; i < r.cases.size(); ++i)
         text += FormatText("%-*s %9s %16.9g\n", caseWidth, r.cases[i].name.c_str(),
                            r.cases[i].unknown ? "unknown" : "known", r.factors[i] + 0.0);
     const auto rows = UlfResultRows(r);
-    const int width = Widest(rows, 10, [](const T_ULF_RESULT_ROW& row) { return row.name; });
+    const auto nameOf = [](const T_ULF_RESULT_ROW& row) { return UlfNameAt(row.name, row.place); };
+    const int width = Widest(rows, 10, nameOf);
     text += FormatText("\n%-*s %15s %15s %15s %13s  %s\n", width, "constraint", "value", "lower",
                        "upper", "missed by", "state");
     for (std::size_t i = 0; i < rows.size(); ++i) {
         const T_ULF_RESULT_ROW& row = rows[i];
         const double scale = UlfScale(r, i);
         const char* const state = !row.met ? "not met" : row.active ? "active" : "-";
-        text += FormatText("%-*s %15.7g %15s %15s %13.3g  %s\n", width, row.name.c_str(),
+        text += FormatText("%-*s %15.7g %15s %15s %13.3g  %s\n", width, nameOf(row).c_str(),
                            Shown(row.value, scale), Short(row.lower).c_str(),
                            Short(row.upper).c_str(), Shown(row.residual, scale), state);
     }

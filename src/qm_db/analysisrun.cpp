@@ -102,9 +102,17 @@ int CAnalysisRun::KeepModes(std::vector<T_EIGV_D> modes)
     return own ? done && m_edit.Commit() : done;
 }
 
-int CAnalysisRun::Run(const T_ANALYSIS_OPTIONS& options, T_ANALYSIS_ERROR& error)
+int CAnalysisRun::Keep(T_ANALYSIS_RESULTS results)
 {
-    const T_MODEL& model = m_data.Model();
+    if (results.staged) m_data.SetStagedResult(std::move(results.staged));
+    for (auto& [key, result] : results.cases)
+        m_data.SetStaticResult(key, std::move(result));
+    return results.modes ? KeepModes(std::move(*results.modes)) : 1;
+}
+
+int CAnalysisRun::Compute(const T_MODEL& model, const T_ANALYSIS_OPTIONS& options,
+                          T_ANALYSIS_RESULTS& out, T_ANALYSIS_ERROR& error)
+{
     T_RUN run{model, options, CAnalysisModel(model), {}, options.cases, 0};
     if (options.allCases) {
         run.cases.clear();
@@ -121,13 +129,11 @@ int CAnalysisRun::Run(const T_ANALYSIS_OPTIONS& options, T_ANALYSIS_ERROR& error
     // Stages alone need not make a structure that stands as a whole.
     std::vector<std::shared_ptr<IStaticResult>> results;
     if ((before > 0 || !hasStages) && !SolveStatic(run, results, error)) return 0;
-    std::vector<T_EIGV_D> modes;
-    if (options.modes > 0 && !FindModes(run, modes, error)) return 0;
-    std::shared_ptr<IStagedResult> stagedResult;
-    if (hasStages && !staged.Run(Part(options, before, run.total), stagedResult, error)) return 0;
-
-    if (hasStages) m_data.SetStagedResult(std::move(stagedResult));
+    T_ANALYSIS_RESULTS found;
+    if (options.modes > 0 && !FindModes(run, found.modes.emplace(), error)) return 0;
+    if (hasStages && !staged.Run(Part(options, before, run.total), found.staged, error)) return 0;
     for (std::size_t i = 0; i < results.size(); ++i)
-        m_data.SetStaticResult(run.cases[i], std::move(results[i]));
-    return options.modes > 0 ? KeepModes(std::move(modes)) : 1;
+        found.cases[run.cases[i]] = std::move(results[i]);
+    out = std::move(found);
+    return 1;
 }

@@ -9,7 +9,6 @@
 void CDataCtrl::Assign(T_MODEL_CONTENT content)
 {
     m_content = std::move(content);
-    m_staged.reset();
     m_modified = false;
     ++m_revision;
 }
@@ -33,7 +32,8 @@ void CDataCtrl::SetStaticResult(int loadCase, std::shared_ptr<IStaticResult> res
 
 void CDataCtrl::SetStagedResult(std::shared_ptr<IStagedResult> result)
 {
-    m_staged = std::move(result);
+    m_content.stagedResult = std::move(result);
+    m_modified = true;
     ++m_revision;
 }
 

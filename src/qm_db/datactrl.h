@@ -80,9 +80,8 @@ public:
     /// The same for a static load case; null removes them.
     void SetStaticResult(int loadCase, std::shared_ptr<IStaticResult> result);
 
-    /// Results of the construction stages; null where there are none. They stay in memory: a model
-    /// file does not keep them.
-    const std::shared_ptr<IStagedResult>& StagedResult() const { return m_staged; }
+    /// Results of the construction stages; null where there are none.
+    const std::shared_ptr<IStagedResult>& StagedResult() const { return m_content.stagedResult; }
     void SetStagedResult(std::shared_ptr<IStagedResult> result);
 
     /// Adds a general combination under the next key, as an edit: within the open step, else as a
@@ -102,13 +101,18 @@ public:
     /// stays; the document counts as modified only when they differ from what is stored.
     void SetPoverSteps(int pushover, const T_POVR_D& steps);
 
+    /// While it is locked (an analysis is under way) no edit begins, changes a record, is undone or
+    /// done again.
+    void SetLocked(bool locked) { m_isLocked = locked; }
+    bool IsLocked() const { return m_isLocked; }
+
     /// For CEditData and CUndoCtrl only: the model to change; marks the document modified.
     T_MODEL& ModelForEdit();
 
 private:
     T_MODEL_CONTENT m_content;
-    std::shared_ptr<IStagedResult> m_staged;
     bool m_modified = false;
+    bool m_isLocked = false;
     long m_revision = 0;
     CEditData* m_editor = nullptr;
 };

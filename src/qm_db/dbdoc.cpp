@@ -14,6 +14,14 @@ CDBDoc*& CurrentDoc()
     return current;
 }
 
+T_ANALYSIS_ERROR Failure(ANALYSIS_FAULT fault, const std::string& text)
+{
+    T_ANALYSIS_ERROR error;
+    error.fault = fault;
+    error.text = text;
+    return error;
+}
+
 } // namespace
 
 CDBDoc::CDBDoc()
@@ -37,6 +45,7 @@ void CDBDoc::SetDocPoint(CDBDoc* doc)
 
 void CDBDoc::Reset(T_MODEL_CONTENT content, const std::string& path)
 {
+    AbandonAnalysis();
     m_data.Assign(std::move(content));
     m_undo.Clear();
     m_path = path;
@@ -92,19 +101,95 @@ int CDBDoc::SaveAs(const std::string& path, T_FILE_ERROR& error)
     return 1;
 }
 
-int CDBDoc::RunAnalysis(const T_ANALYSIS_OPTIONS& options, T_ANALYSIS_ERROR& error)
+int CDBDoc::StartAnalysis(T_ANALYSIS_OPTIONS options, T_ANALYSIS_ERROR& error)
 {
-    if (m_running.exchange(true)) {
-        error = {};
-        error.fault = ANALYSIS_FAULT::Failed;
-        error.text = "an analysis of this model is running already";
+    if (m_worker) {
+        error = Failure(ANALYSIS_FAULT::Failed, "an analysis of this model is running already");
         return 0;
     }
-    struct T_END {
-        std::atomic<bool>& running;
-        ~T_END() { running = false; }
-    } const end{m_running};
-    return CAnalysisRun(m_data, m_edit).Run(options, error);
+    error = {};
+    m_progress = std::exchange(options.progress, {});
+    m_revisionAtStart = m_data.Revision();
+    auto job = [model = m_data.Model(), options = std::move(options)](
+                   const auto& progress, T_ANALYSIS_RESULTS& out, T_ANALYSIS_ERROR& fault) {
+        T_ANALYSIS_OPTIONS told = options;
+        told.progress = progress;
+        return CAnalysisRun::Compute(model, told, out, fault);
+    };
+    try {
+        m_worker = std::make_shared<CAnalysisWorker>(std::move(job));
+    } catch (const std::exception& fault) { // no thread
+        error = Failure(ANALYSIS_FAULT::Failed, fault.what());
+        return 0;
+    }
+    m_data.SetLocked(true);
+    return 1;
+}
+
+bool CDBDoc::PollAnalysis(int waitMs)
+{
+    if (!m_worker || m_isTelling) return IsExcuted();
+    const std::shared_ptr<CAnalysisWorker> worker = m_worker; // the progress may abandon the run
+    std::vector<CAnalysisWorker::T_PART> parts;
+    const bool isDone = worker->TakeParts(waitMs, parts);
+    struct T_TELLING {
+        bool& flag;
+        explicit T_TELLING(bool& f) : flag(f) { flag = true; }
+        ~T_TELLING() { flag = false; }
+    } const telling(m_isTelling);
+    for (const auto& [done, total] : parts) {
+        if (m_worker != worker || worker->IsCancelled() || !m_progress) break;
+        if (!m_progress(done, total)) worker->Cancel();
+    }
+    if (isDone && m_worker == worker) EndAnalysis();
+    return IsExcuted();
+}
+
+void CDBDoc::EndAnalysis()
+{
+    const std::shared_ptr<CAnalysisWorker> worker = std::exchange(m_worker, nullptr);
+    m_progress = {};
+    m_data.SetLocked(false);
+    T_ANALYSIS_RESULTS results;
+    const int done = worker->Finish(results, m_outcome);
+    if (worker->IsCancelled())
+        m_outcome = Failure(ANALYSIS_FAULT::Cancelled, "cancelled");
+    else if (done && m_data.Revision() != m_revisionAtStart)
+        m_outcome = Failure(ANALYSIS_FAULT::Failed, "the model was changed during the analysis");
+    else if (done && !CAnalysisRun(m_data, m_edit).Keep(std::move(results)))
+        m_outcome = Failure(ANALYSIS_FAULT::Failed, "the modes could not be changed");
+}
+
+void CDBDoc::AbandonAnalysis()
+{
+    if (!m_worker) return;
+    m_worker->Cancel();
+    EndAnalysis();
+}
+
+void CDBDoc::CancelAnalysis()
+{
+    if (m_worker) m_worker->Cancel();
+}
+
+int CDBDoc::AnalysisOutcome(T_ANALYSIS_ERROR& error) const
+{
+    error = m_outcome;
+    return error.fault == ANALYSIS_FAULT::None ? 1 : 0;
+}
+
+int CDBDoc::RunAnalysis(const T_ANALYSIS_OPTIONS& options, T_ANALYSIS_ERROR& error)
+{
+    constexpr int kWaitMs = 1000; // news come at once
+    if (!StartAnalysis(options, error)) return 0;
+    try {
+        while (PollAnalysis(kWaitMs)) {
+        }
+    } catch (...) {
+        AbandonAnalysis();
+        throw;
+    }
+    return AnalysisOutcome(error);
 }
 
 bool CDBDoc::IsPostMode()

@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_base/dynmodule.h"
-#include "qm_db/analysisrun.h"
+#include "qm_db/analysisworker.h"
 #include "qm_db/attrctrl.h"
 #include "qm_db/dblib.h"
 #include "qm_db/editdata.h"
@@ -10,8 +10,6 @@
 #include "qm_db/membctrl.h"
 #include "qm_db/postctrl.h"
 #include "qm_db/unitctrl.h"
-
-#include <atomic>
 
 class CDBDoc {
 public:
@@ -53,11 +51,25 @@ public:
     /// belongs to that path. 1 done; 0 error filled, the file on disk as it was.
     [[nodiscard]] int SaveAs(const std::string& path, T_FILE_ERROR& error);
 
-    /// Analysis of static load cases and construction stages, and eigen modes: see
-    /// CAnalysisRun::Run. Returns when it is done; 0 also while another run is under way.
+    /// Starts an analysis of static load cases, construction stages and eigen modes (see
+    /// CAnalysisRun::Compute) of a copy of the model in a thread of its own. Until PollAnalysis
+    /// says that it has ended, the document refuses edits; opening another model cancels it, as the
+    /// end of the document does. 1 started; 0 error filled: another run is under way.
+    [[nodiscard]] int StartAnalysis(T_ANALYSIS_OPTIONS options, T_ANALYSIS_ERROR& error);
+    /// Waits up to waitMs for news of the run, tells options.progress of them one after the other
+    /// (in this thread), and at the end puts the results into the document. True: the run goes on.
+    bool PollAnalysis(int waitMs = 0);
+    /// Ends the run as soon as the engine comes to a next part; without results, whatever it has
+    /// got done by then. Nothing happens when there is none.
+    void CancelAnalysis();
+    /// How the latest run has ended. 1 its results are in the document; 0 error says why not, and
+    /// neither results nor modes have changed. Also 0 when the model was changed in spite of all.
+    [[nodiscard]] int AnalysisOutcome(T_ANALYSIS_ERROR& error) const;
+    /// Starts a run and waits for its end, progress being told meanwhile. Outcome as above; 0 also
+    /// while another run is under way. What the progress throws cancels the run.
     [[nodiscard]] int RunAnalysis(const T_ANALYSIS_OPTIONS& options, T_ANALYSIS_ERROR& error);
-    /// Whether a run is under way, in its progress or in another thread.
-    bool IsExcuted() const { return m_running; }
+    /// Whether a run is under way: from its start until its results are in the document.
+    bool IsExcuted() const { return m_worker != nullptr; }
     /// Whether there are results of the model as it is: of its construction stages where it has
     /// any, else of a static load case.
     bool IsPostMode();
@@ -67,6 +79,8 @@ public:
 
 private:
     void Reset(T_MODEL_CONTENT content, const std::string& path);
+    void EndAnalysis();
+    void AbandonAnalysis();
 
     CDataCtrl m_data;
     CAttrCtrl m_attr{m_data};
@@ -80,5 +94,11 @@ private:
     CDynModuleMgr m_modules;
     CModelStore m_store;
     std::string m_path;
-    std::atomic<bool> m_running = false;
+
+    /// The run that is under way, and how the latest one has ended.
+    std::shared_ptr<CAnalysisWorker> m_worker;
+    decltype(T_ANALYSIS_OPTIONS::progress) m_progress;
+    long m_revisionAtStart = 0;
+    bool m_isTelling = false; // the progress
+    T_ANALYSIS_ERROR m_outcome;
 };

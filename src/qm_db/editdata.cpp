@@ -8,7 +8,7 @@
 
 int CEditData::Begin(std::string title)
 {
-    if (m_open) return 0;
+    if (m_open || m_data.IsLocked()) return 0;
     m_step = {std::move(title), {}};
     m_open = true;
     return 1;
@@ -89,6 +89,7 @@ bool CEditData::ContainsItself(int key, const T_LCOM_D& record) const
 
 int CEditData::Record(T_CHANGE_ANY change)
 {
+    if (m_data.IsLocked()) return 0;
     CUndoCtrl::Apply(m_data.ModelForEdit(), change, true);
     m_step.changes.push_back(std::move(change));
     return 1;

@@ -17,7 +17,8 @@ public:
     CEditData& operator=(const CEditData&) = delete;
     ~CEditData() { m_data.SetEditor(nullptr); }
 
-    /// Starts a step. 1 started; 0 another one is open.
+    /// Starts a step. 1 started; 0 another one is open, or the data are locked (then nothing in an
+    /// open step changes either).
     [[nodiscard]] int Begin(std::string title);
     /// Ends the step and makes it undoable. 1 done; 0 none was open.
     [[nodiscard]] int Commit();

@@ -9,7 +9,7 @@
 #include "qm_db/sqlitedb.h"
 #include "qm_db/sqlitestmt.h"
 #include "qm_db/sqlitetransaction.h"
-#include "qm_db/staticblocks.h"
+#include "qm_db/stagedblocks.h"
 #include "qm_db/storefault.h"
 
 #include <algorithm>
@@ -170,6 +170,7 @@ T_MODEL_CONTENT ReadModelFile(const std::string& path, const T_SCHEMA& schema, C
     content.model = ReadModel(*db, found);
     const std::vector<T_RESULT_HEAD> heads = ReadResultHeads(*db, found);
     const std::vector<T_STATIC_HEAD> staticHeads = ReadStaticHeads(*db, found);
+    const std::vector<T_STAGED_HEAD> stagedHeads = ReadStagedHeads(*db, found);
     if (!older) {
         const T_TABLE_SUMS stored = ReadChecksums(*db);
         found[kSchemaTable] = SumOfTable(*db, kSchemaTable);
@@ -179,12 +180,17 @@ T_MODEL_CONTENT ReadModelFile(const std::string& path, const T_SCHEMA& schema, C
     }
     if (whole) {
         CheckBlocks(*db, heads);
-        CheckStaticBlocks(*db, staticHeads);
+        std::vector<T_STATIC_HEAD> all = staticHeads;
+        for (const T_STAGED_HEAD& staged : stagedHeads)
+            all.push_back(staged.head);
+        CheckStaticBlocks(*db, all);
     }
     for (const T_RESULT_HEAD& head : heads)
         content.results[head.pushover] = std::make_shared<CBlockPushResult>(db, path, head);
     for (const T_STATIC_HEAD& head : staticHeads)
         content.staticResults[head.loadCase] = std::make_shared<CBlockStaticResult>(db, path, head);
+    if (!stagedHeads.empty())
+        content.stagedResult = std::make_shared<CBlockStagedResult>(db, path, stagedHeads);
     return content;
 }
 
@@ -211,6 +217,8 @@ void WriteModelFile(const std::string& path, const T_MODEL_CONTENT& content)
     WriteModel(db, content.model);
     WriteResults(db, content.results);
     WriteStaticResults(db, content.model, content.staticResults);
+    if (content.stagedResult && !content.model.stages.empty())
+        WriteStagedResults(db, *content.stagedResult);
     WriteChecksums(db);
     transaction.Commit();
 }

@@ -51,7 +51,11 @@ constexpr const char* kVersion4[] = {
     "CREATE TABLE stages(key INTEGER PRIMARY KEY, name TEXT NOT NULL, body TEXT NOT NULL, "
     "negative_zeros INTEGER NOT NULL) STRICT",
     "CREATE TABLE ulf_stage_items(key INTEGER PRIMARY KEY, name TEXT NOT NULL, "
-    "body TEXT NOT NULL, negative_zeros INTEGER NOT NULL) STRICT"};
+    "body TEXT NOT NULL, negative_zeros INTEGER NOT NULL) STRICT",
+    "CREATE TABLE staged_results(key INTEGER PRIMARY KEY, stage INTEGER NOT NULL, "
+    "step INTEGER NOT NULL, load_case INTEGER NOT NULL, load_group INTEGER NOT NULL, "
+    "nodes INTEGER NOT NULL, elements INTEGER NOT NULL, fingerprint INTEGER NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT"};
 
 // Scalars are typed columns, quantities in SI. Bit i of negative_zeros says that the i-th column
 // of the row is -0.0: a REAL column stores a whole number as an integer, which has no such value.
@@ -104,7 +108,7 @@ constexpr const char* kTables[] = {
     // one step; of static results 4 ids of 512 nodes, 5 ids of 512 elements, 6 displacements and
     // 7 reactions of the nodes, 8 forces of the elements. pushover is the key of the load case,
     // of a static one from part 4 on. chunk and step count from 0 and are 0 where they mean
-    // nothing.
+    // nothing; step of a result of construction stages is its key in staged_results, from 1.
     "CREATE TABLE result_blocks(pushover INTEGER NOT NULL, part INTEGER NOT NULL, "
     "chunk INTEGER NOT NULL, step INTEGER NOT NULL, count INTEGER NOT NULL, "
     "width INTEGER NOT NULL, byte_order TEXT NOT NULL, checksum INTEGER NOT NULL, "

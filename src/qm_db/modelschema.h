@@ -24,7 +24,7 @@ struct T_SCHEMA {
 
 /// Tables with a checksum of their own, in the order of writing. "sqlite_schema" (the text of the
 /// schema itself) is summed too; result_blocks is summed without the data, which have their own.
-inline constexpr std::array<const char*, 23> kModelTables{"model",
+inline constexpr std::array<const char*, 24> kModelTables{"model",
                                                           "storeys",
                                                           "modes",
                                                           "spectra",
@@ -46,7 +46,8 @@ inline constexpr std::array<const char*, 23> kModelTables{"model",
                                                           "ulf_items",
                                                           "static_results",
                                                           "stages",
-                                                          "ulf_stage_items"};
+                                                          "ulf_stage_items",
+                                                          "staged_results"};
 inline constexpr const char* kBlockTable = "result_blocks";
 inline constexpr const char* kSumTable = "checksums";
 

@@ -6,7 +6,7 @@
 #include "qm_db/fileerror.h"
 #include "qm_db/pushresult.h"
 #include "qm_db/records.h"
-#include "qm_db/staticresult.h"
+#include "qm_db/stagedresult.h"
 
 #include <memory>
 #include <string>
@@ -20,7 +20,8 @@ enum class OPEN_MODE {
 struct T_MODEL_CONTENT {
     T_MODEL model;        // SI
     T_RESULT_MAP results; // by the key of the pushover load case; file-backed sources stay lazy
-    T_STATIC_MAP staticResults{}; // by the key of the static load case, likewise
+    T_STATIC_MAP staticResults{};                  // by the key of the static load case, likewise
+    std::shared_ptr<IStagedResult> stagedResult{}; // of the construction stages, or null; likewise
 };
 
 /// Keeps the writer's lock of one model file until it is destroyed.

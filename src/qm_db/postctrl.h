@@ -102,8 +102,8 @@ public:
     void SelectStage(int stage, int step, int load);
     /// The selected stage result in current units, signs and positions as those of the static
     /// results; what does not stand at that stage has zeros. 1 done; 0 output as it was and Error
-    /// says why: the stages have no results (those of a run are not kept in the model file), or
-    /// older ones than the model; no such stage, step, load case, node or element of that kind.
+    /// says why: the stages have no results, or older ones than the model; no such stage, step,
+    /// load case, node or element of that kind.
     [[nodiscard]] int GetDspcNew(int node, T_DOF6& out);
     [[nodiscard]] int GetReccNew(int node, T_DOF6& out);
     [[nodiscard]] int GetStrtcNew(int element, double& axial);

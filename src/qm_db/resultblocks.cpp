@@ -163,11 +163,12 @@ void CBlockWriter::Insert(const T_BLOCK_KEY& key, int count, std::span<const std
 CBlockRun::CBlockRun(const CSqliteDb& db, T_BLOCK_KEY key)
     : m_key(key), m_rows(db, std::string("SELECT ") + kBlockColumns + " FROM " + kBlockTable +
                                  " WHERE pushover = ?1 AND part = ?2 AND chunk = ?3 "
-                                 "ORDER BY step")
+                                 "AND step >= ?4 ORDER BY step")
 {
     m_rows.Bind(1, std::int64_t{key.pushover});
     m_rows.Bind(2, std::int64_t{static_cast<int>(key.part)});
     m_rows.Bind(3, std::int64_t{key.chunk});
+    m_rows.Bind(4, std::int64_t{key.step});
 }
 
 std::span<const std::byte> CBlockRun::Step(int count)
@@ -185,10 +186,16 @@ int HeadField(const CRecordRow& row, const char* column)
 
 void ThrowBadBlock(const T_BLOCK_KEY& key)
 {
-    ThrowDamaged(MMSGFunction::Format(
-        "IDS_QM_DB_DAMAGE_BLOCK",
-        {std::to_string(key.pushover), MMSGFunction::GetValue(PartOf(key).nameKey),
-         std::to_string(key.chunk + 1), std::to_string(key.step + 1)}));
+    const std::string loadCase = std::to_string(key.pushover);
+    const std::string chunk = std::to_string(key.chunk + 1);
+    const std::string part = MMSGFunction::GetValue(PartOf(key).nameKey);
+    if (key.stage != 0) {
+        ThrowDamaged(MMSGFunction::Format(
+            "IDS_QM_DB_DAMAGE_STAGE_BLOCK",
+            {std::to_string(key.stage), std::to_string(key.stageStep), loadCase, part, chunk}));
+    }
+    ThrowDamaged(MMSGFunction::Format("IDS_QM_DB_DAMAGE_BLOCK",
+                                      {loadCase, part, chunk, std::to_string(key.step + 1)}));
 }
 
 std::span<const std::byte> CheckedBlock(const CSqliteStmt& row, const T_BLOCK_KEY& key, int count)

@@ -36,7 +36,8 @@ struct T_BLOCK_KEY {
     int pushover = 0; // key of the load case, of a static one for the parts of static results
     BLOCK_PART part = BLOCK_PART::LoadFactor;
     int chunk = 0; // from 0: nodes 512 * chunk ... of the list of node ids
-    int step = 0;  // from 0
+    int step = 0;  // from 0; of construction stages: the row of "staged_results", from 1
+    int stage = 0, stageStep = 0; // of construction stages; for messages only
     bool operator==(const T_BLOCK_KEY&) const = default;
 };
 
@@ -72,7 +73,7 @@ private:
     CSqliteStmt m_insert;
 };
 
-/// Reads the blocks of one part and chunk in the order of steps.
+/// Reads the blocks of one part and chunk in the order of steps, from the step of the key on.
 class CBlockRun {
 public:
     CBlockRun(const CSqliteDb& db, T_BLOCK_KEY key);

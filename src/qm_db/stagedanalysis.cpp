@@ -26,7 +26,7 @@ std::size_t IndexOf(const std::vector<int>& keys, int key)
 class CEngineStagedResult : public IStagedResult {
 public:
     struct T_KEYS {
-        std::vector<int> stages, cases, nodes, elements;
+        std::vector<int> stages, cases, groups, nodes, elements; // groups: by case
     };
     CEngineStagedResult(solver::CStagedSolver engine, T_KEYS keys, std::uint64_t fingerprint)
         : m_engine(std::move(engine)), m_keys(std::move(keys)), m_fingerprint(fingerprint)
@@ -34,21 +34,25 @@ public:
     }
 
     std::uint64_t Fingerprint() const override { return m_fingerprint; }
-    bool HasLoadCase(int key) const override
+    std::vector<T_STAGE_CASE> Cases() const override
     {
-        return IndexOf(m_keys.cases, key) < m_keys.cases.size();
+        std::vector<T_STAGE_CASE> all;
+        for (std::size_t stage = 0; stage < m_keys.stages.size(); ++stage)
+            for (int step = kStageFirstStep; step <= m_engine.StepCount(stage); ++step)
+                for (std::size_t i = 0; i < m_keys.cases.size(); ++i)
+                    all.push_back(
+                        {{m_keys.stages[stage], step, m_keys.cases[i]}, m_keys.groups[i]});
+        return all;
     }
-    int Read(const T_STAGE_CHOICE& choice, T_STATIC_DATA& out) const override
+    int Open(const T_STAGE_CHOICE& choice,
+             std::vector<std::shared_ptr<IStaticResult>>& out) const override
     {
         solver::T_RESULT result;
         const std::size_t stage = IndexOf(m_keys.stages, choice.stage);
         if (stage == m_keys.stages.size() || !ReadEngine(stage, choice, result)) return 0;
-        out = {m_fingerprint,
-               m_keys.nodes,
-               std::move(result.displacement),
-               std::move(result.reaction),
-               m_keys.elements,
-               std::move(result.force)};
+        out = {MakeStaticResult({m_fingerprint, m_keys.nodes, std::move(result.displacement),
+                                 std::move(result.reaction), m_keys.elements,
+                                 std::move(result.force)})};
         return 1;
     }
 
@@ -64,10 +68,7 @@ private:
         case kStageLoadErection:
             return m_engine.ReadSum(stage, choice.step, S::Erection, out);
         default:
-            return HasLoadCase(choice.load)
-                       ? m_engine.ReadCase(stage, choice.step, IndexOf(m_keys.cases, choice.load),
-                                           out)
-                       : 0;
+            return m_engine.ReadCase(stage, choice.step, IndexOf(m_keys.cases, choice.load), out);
         }
     }
 
@@ -86,6 +87,20 @@ std::vector<int> StageLoadCases(const T_MODEL& model)
             for (const T_STAG_LOAD& load : part->loads)
                 keys.insert(load.loadCase);
     return {keys.begin(), keys.end()};
+}
+
+bool BelongsTo(int load, int loadCase, int group)
+{
+    switch (load) {
+    case kStageLoadSum:
+        return true;
+    case kStageLoadDead:
+        return group == kLoadGroupDead;
+    case kStageLoadErection:
+        return group == kLoadGroupErection;
+    default:
+        return load == loadCase;
+    }
 }
 
 CStagedAnalysis::CStagedAnalysis(const T_MODEL& model)
@@ -218,9 +233,13 @@ int CStagedAnalysis::Run(const solver::ProgressFn& progress, std::shared_ptr<ISt
     solver::T_SOLVER_ERROR fault;
     if (!engine.Prepare(m_staged, fault) || !engine.Run(m_loads, fault, progress))
         return Fail(fault, error);
+    std::vector<int> groups;
+    for (const int key : m_cases)
+        groups.push_back(m_model.loadCases.at(key).group);
     out = std::make_shared<CEngineStagedResult>(
         std::move(engine),
-        CEngineStagedResult::T_KEYS{m_stages, m_cases, m_frame.NodeIds(), m_frame.ElementIds()},
+        CEngineStagedResult::T_KEYS{m_stages, m_cases, std::move(groups), m_frame.NodeIds(),
+                                    m_frame.ElementIds()},
         FingerprintOfStages(m_model));
     return 1;
 }

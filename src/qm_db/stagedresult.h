@@ -13,6 +13,16 @@ struct T_STAGE_CHOICE {
     auto operator<=>(const T_STAGE_CHOICE&) const = default;
 };
 
+/// A load case at the end of a step, with the group whose sums it belongs to.
+struct T_STAGE_CASE {
+    T_STAGE_CHOICE at; // of the load case; no sum
+    int group = kLoadGroupRest;
+    bool operator==(const T_STAGE_CASE&) const = default;
+};
+
+/// Whether a load case of that group belongs to what `load` selects: itself, or a sum.
+bool BelongsTo(int load, int loadCase, int group);
+
 class IStagedResult {
 public:
     IStagedResult() = default;
@@ -22,11 +32,13 @@ public:
 
     /// Of what they were computed from, see FingerprintOfStages.
     virtual std::uint64_t Fingerprint() const = 0;
-    /// Whether the load case acts in a stage.
-    virtual bool HasLoadCase(int key) const = 0;
-    /// Everything of one choice, in one pass through the model; what does not stand then has zeros.
-    /// 1 done; 0 there is no such result, output as it was.
-    [[nodiscard]] virtual int Read(const T_STAGE_CHOICE& choice, T_STATIC_DATA& out) const = 0;
+    /// Every load case at every step of every stage.
+    virtual std::vector<T_STAGE_CASE> Cases() const = 0;
+    /// The results that add up to one choice, perhaps none. A node or an element of the model that
+    /// one of them does not have has zeros in it, as what does not stand then. The step is a
+    /// number. 1 done; 0 there is no such result, output as it was.
+    [[nodiscard]] virtual int Open(const T_STAGE_CHOICE& choice,
+                                   std::vector<std::shared_ptr<IStaticResult>>& out) const = 0;
 };
 
 /// Keys of the load cases that come or go at a stage, ascending.

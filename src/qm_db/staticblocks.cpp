@@ -9,6 +9,7 @@
 #include <algorithm>
 #include <bit>
 #include <cmath>
+#include <tuple>
 
 namespace {
 
@@ -49,16 +50,22 @@ std::span<const double> Flat(const std::vector<T>& values)
             values.size() * (sizeof(T) / sizeof(double))};
 }
 
+T_BLOCK_KEY KeyOf(const T_STATIC_HEAD& head, BLOCK_PART part, int chunk)
+{
+    return {head.loadCase, part, chunk, head.row, head.stage, head.step};
+}
+
 /// Writes one part, chunk by chunk.
 template <class T>
-void WritePart(CBlockWriter& blocks, int loadCase, BLOCK_PART part, int count,
+void WritePart(CBlockWriter& blocks, const T_STATIC_HEAD& head, BLOCK_PART part,
                std::span<const T> values)
 {
+    const int count = CountOf(head, PartOf(part));
     const auto width = static_cast<std::size_t>(PartOf(part).width);
     for (int chunk = 0; chunk < ChunkCount(count); ++chunk) {
         const auto from = static_cast<std::size_t>(chunk * kBlockNodes) * width;
         const auto size = static_cast<std::size_t>(ChunkSize(count, chunk)) * width;
-        blocks.Write({loadCase, part, chunk}, values.subspan(from, size));
+        blocks.Write(KeyOf(head, part, chunk), values.subspan(from, size));
     }
 }
 
@@ -89,23 +96,39 @@ void WriteCase(const CSqliteDb& db, CBlockWriter& blocks, int key, IStaticResult
         throw CStoreFault(FILE_FAULT::BadInput, "IDS_QM_DB_FILE_RESULT_SOURCE", std::to_string(key),
                           source.Error());
     }
-    CheckData(data, kStaticTable + (' ' + std::to_string(key)));
-    const int nodes = static_cast<int>(data.nodes.size());
-    const int elements = static_cast<int>(data.elements.size());
     CRecordRow row(kStaticTable, key);
-    row.Put("nodes", std::int64_t{nodes});
-    row.Put("elements", std::int64_t{elements});
-    row.Put("fingerprint", std::bit_cast<std::int64_t>(data.fingerprint));
-    row.Insert(db);
-    WritePart(blocks, key, BLOCK_PART::StaticNodes, nodes, std::span<const int>(data.nodes));
-    WritePart(blocks, key, BLOCK_PART::StaticElements, elements,
-              std::span<const int>(data.elements));
-    WritePart(blocks, key, BLOCK_PART::StaticDisplacement, nodes, Flat(data.displacement));
-    WritePart(blocks, key, BLOCK_PART::StaticReaction, nodes, Flat(data.reaction));
-    WritePart(blocks, key, BLOCK_PART::StaticForce, elements, Flat(data.force));
+    T_STATIC_HEAD head;
+    head.loadCase = key;
+    WriteStaticBlocks(db, blocks, row, head, data);
 }
 
 } // namespace
+
+T_STATIC_HEAD ReadHead(const CRecordRow& row)
+{
+    const auto* const print = std::get_if<std::int64_t>(&row.Get("fingerprint"));
+    if (!print) row.ThrowBadCell("fingerprint");
+    return {0, HeadField(row, "nodes"), HeadField(row, "elements"),
+            std::bit_cast<std::uint64_t>(*print)};
+}
+
+void WriteStaticBlocks(const CSqliteDb& db, CBlockWriter& blocks, CRecordRow& row,
+                       const T_STATIC_HEAD& of, const T_STATIC_DATA& data)
+{
+    CheckData(data, row.Table() + ' ' + std::to_string(row.Key()));
+    T_STATIC_HEAD head = of;
+    head.nodes = static_cast<int>(data.nodes.size());
+    head.elements = static_cast<int>(data.elements.size());
+    row.Put("nodes", std::int64_t{head.nodes});
+    row.Put("elements", std::int64_t{head.elements});
+    row.Put("fingerprint", std::bit_cast<std::int64_t>(data.fingerprint));
+    row.Insert(db);
+    WritePart(blocks, head, BLOCK_PART::StaticNodes, std::span<const int>(data.nodes));
+    WritePart(blocks, head, BLOCK_PART::StaticElements, std::span<const int>(data.elements));
+    WritePart(blocks, head, BLOCK_PART::StaticDisplacement, Flat(data.displacement));
+    WritePart(blocks, head, BLOCK_PART::StaticReaction, Flat(data.reaction));
+    WritePart(blocks, head, BLOCK_PART::StaticForce, Flat(data.force));
+}
 
 void WriteStaticResults(const CSqliteDb& db, const T_MODEL& model, const T_STATIC_MAP& results)
 {
@@ -121,10 +144,9 @@ std::vector<T_STATIC_HEAD> ReadStaticHeads(const CSqliteDb& db, T_TABLE_SUMS& su
     CChecksum sum;
     for (const CRecordRow& row : CRecordRow::ReadAll(db, kStaticTable, sum)) {
         const auto key = static_cast<int>(row.Key());
-        const auto* const print = std::get_if<std::int64_t>(&row.Get("fingerprint"));
-        if (key != row.Key() || !print) row.ThrowBadCell("key");
-        heads.push_back({key, HeadField(row, "nodes"), HeadField(row, "elements"),
-                         std::bit_cast<std::uint64_t>(*print)});
+        if (key != row.Key()) row.ThrowBadCell("key");
+        heads.push_back(ReadHead(row));
+        heads.back().loadCase = key;
     }
     sums[kStaticTable] = sum.Value();
     return heads;
@@ -132,18 +154,26 @@ std::vector<T_STATIC_HEAD> ReadStaticHeads(const CSqliteDb& db, T_TABLE_SUMS& su
 
 void CheckStaticBlocks(const CSqliteDb& db, const std::vector<T_STATIC_HEAD>& heads)
 {
-    CSqliteStmt rows(db, std::string("SELECT ") + kBlockColumns + " FROM " + kBlockTable +
-                             " WHERE part >= ?1 ORDER BY pushover, part, chunk, step");
-    rows.Bind(1, std::int64_t{static_cast<int>(BLOCK_PART::StaticNodes)});
+    std::vector<std::pair<T_BLOCK_KEY, int>> expected; // with the count of numbers
     for (const T_STATIC_HEAD& head : heads) {
         for (const T_STATIC_PART& part : kParts) {
             const int count = CountOf(head, part);
-            for (int chunk = 0; chunk < ChunkCount(count); ++chunk) {
-                const T_BLOCK_KEY key{head.loadCase, part.part, chunk};
-                if (!rows.Step()) ThrowBadBlock(key);
-                CheckedBlock(rows, key, ChunkSize(count, chunk) * part.width);
-            }
+            for (int chunk = 0; chunk < ChunkCount(count); ++chunk)
+                expected.emplace_back(KeyOf(head, part.part, chunk),
+                                      ChunkSize(count, chunk) * part.width);
         }
+    }
+    const auto place = [](const auto& block) {
+        const T_BLOCK_KEY& k = block.first;
+        return std::tuple(k.pushover, k.part, k.chunk, k.step);
+    };
+    std::ranges::sort(expected, {}, place);
+    CSqliteStmt rows(db, std::string("SELECT ") + kBlockColumns + " FROM " + kBlockTable +
+                             " WHERE part >= ?1 ORDER BY pushover, part, chunk, step");
+    rows.Bind(1, std::int64_t{static_cast<int>(BLOCK_PART::StaticNodes)});
+    for (const auto& [key, count] : expected) {
+        if (!rows.Step()) ThrowBadBlock(key);
+        CheckedBlock(rows, key, count);
     }
     if (rows.Step()) ThrowDamaged(kBlockTable);
 }
@@ -174,7 +204,7 @@ const std::vector<int>& CBlockStaticResult::Ids(BLOCK_PART part, int chunk)
     const auto it = known.find(chunk);
     if (it != known.end()) return it->second;
     std::vector<int> ids;
-    CBlockRun(*m_db, {m_head.loadCase, part, chunk})
+    CBlockRun(*m_db, KeyOf(m_head, part, chunk))
         .Next(ChunkSize(CountOf(m_head, PartOf(part)), chunk), ids);
     return known.emplace(chunk, std::move(ids)).first->second;
 }
@@ -211,7 +241,7 @@ int CBlockStaticResult::Read(BLOCK_PART part, int id, T& out)
         const int chunk = at / kBlockNodes;
         if (block.chunk != chunk) {
             block = {};
-            CBlockRun(*m_db, {m_head.loadCase, part, chunk})
+            CBlockRun(*m_db, KeyOf(m_head, part, chunk))
                 .Next(ChunkSize(count, chunk) * kind.width, block.values);
             block.chunk = chunk;
         }
@@ -244,7 +274,7 @@ int CBlockStaticResult::ReadAll(T_STATIC_DATA& out)
         const auto read = [&](BLOCK_PART part, auto& values) {
             const int count = CountOf(m_head, PartOf(part));
             for (int chunk = 0; chunk < ChunkCount(count); ++chunk)
-                CBlockRun(*m_db, {m_head.loadCase, part, chunk})
+                CBlockRun(*m_db, KeyOf(m_head, part, chunk))
                     .Next(ChunkSize(count, chunk) * PartOf(part).width, values);
         };
         read(BLOCK_PART::StaticNodes, data.nodes);

@@ -1,5 +1,6 @@
 // Static results in the model file: a row of "static_results" per load case, and blocks in the
-// table of result blocks, each with the ids, or the numbers of 512 nodes or elements.
+// table of result blocks, each with the ids, or the numbers of 512 nodes or elements. Results of
+// construction stages (stagedblocks.h) have the same blocks under a head of their own.
 #pragma once
 
 #include "qm_db/resultblocks.h"
@@ -8,13 +9,23 @@
 #include <memory>
 #include <unordered_map>
 
-/// A row of the table "static_results".
+/// A row of the table "static_results", or of "staged_results".
 struct T_STATIC_HEAD {
     int loadCase = 0;
     int nodes = 0;
     int elements = 0;
     std::uint64_t fingerprint = 0;
+    // Of "staged_results" only: key of the row, from 1, stage and step. Elsewhere 0.
+    int row = 0;
+    int stage = 0, step = 0;
 };
+
+/// Reads the fields that both tables have, but for the load case.
+T_STATIC_HEAD ReadHead(const CRecordRow& row);
+/// Writes the row of the head, with the columns that `row` has already, and the blocks; throws
+/// CStoreFault (BadInput for unequal lengths and for numbers that are not finite).
+void WriteStaticBlocks(const CSqliteDb& db, CBlockWriter& blocks, CRecordRow& row,
+                       const T_STATIC_HEAD& head, const T_STATIC_DATA& data);
 
 /// Writes the results of the load cases of the model; throws CStoreFault (BadInput for a source
 /// that fails, for unequal lengths and for numbers that are not finite).
@@ -23,7 +34,8 @@ void WriteStaticResults(const CSqliteDb& db, const T_MODEL& model, const T_STATI
 /// Rows of "static_results"; their sum goes to `sums`.
 std::vector<T_STATIC_HEAD> ReadStaticHeads(const CSqliteDb& db, T_TABLE_SUMS& sums);
 
-/// Reads and checks every block of these results, and that there are no others of these parts.
+/// Reads and checks every block of these results, static and of stages, and that there are no
+/// others of these parts.
 void CheckStaticBlocks(const CSqliteDb& db, const std::vector<T_STATIC_HEAD>& heads);
 
 /// Reads only the blocks that hold what is asked for, checking each; keeps the blocks of ids that

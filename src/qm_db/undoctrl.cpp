@@ -31,7 +31,7 @@ void CUndoCtrl::Apply(T_MODEL& model, const T_CHANGE_ANY& change, bool forward)
 
 int CUndoCtrl::Undo()
 {
-    if (m_done.empty()) return 0;
+    if (m_done.empty() || m_data.IsLocked()) return 0;
     T_UNDO_STEP step = std::move(m_done.back());
     m_done.pop_back();
     T_MODEL& model = m_data.ModelForEdit();
@@ -43,7 +43,7 @@ int CUndoCtrl::Undo()
 
 int CUndoCtrl::Redo()
 {
-    if (m_undone.empty()) return 0;
+    if (m_undone.empty() || m_data.IsLocked()) return 0;
     T_UNDO_STEP step = std::move(m_undone.back());
     m_undone.pop_back();
     T_MODEL& model = m_data.ModelForEdit();

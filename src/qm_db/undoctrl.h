@@ -38,7 +38,8 @@ public:
     bool CanRedo() const { return !m_undone.empty(); }
     std::string UndoTitle() const { return CanUndo() ? m_done.back().title : std::string(); }
 
-    /// Takes back the latest step, or applies it again. 1 done; 0 there is none.
+    /// Takes back the latest step, or applies it again. 1 done; 0 there is none, or the
+    /// data are locked.
     [[nodiscard]] int Undo();
     [[nodiscard]] int Redo();
 

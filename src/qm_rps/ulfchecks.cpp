@@ -130,7 +130,7 @@ bool AllDiffer(const std::vector<T>& list, KEY key)
 const T_RULE<I> kItemRules[] = {
     {{"IDS_RPS_No_Item_Name_", kLit, nullptr, nullptr, "name"}, [](const I& k) { return !k.item.name.empty(); }},
     {{kUlfItemError, kKey, "IDS_QM_ULFI_NAME_EXISTS", nullptr, "name"},
-     [](const I& k) { return k.item.name.empty() || !NameTaken(k.model.ulfItems, k.item.name, k.ownKey); }},
+     [](const I& k) { return k.item.name.empty() || (!NameTaken(k.model.ulfItems, k.item.name, k.ownKey) && !NameTaken(k.model.ulfStageItems, k.item.name, 0)); }},
     {{"IDS_RPS_No_General_Load_Combination_exist_", kLit, nullptr, nullptr, "combination"}, HasCombinations},
     {{kUlfItemError, kKey, "IDS_QM_ULFI_COMBINATION", nullptr, "combination"}, [](const I& k) { return k.cases.has_value(); }, HasCombinations},
     {{kUlfItemError, kKey, "IDS_QM_ULFI_OBJECTIVE", nullptr, "objective"}, [](const I& k) { return k.item.objective >= 0 && k.item.objective <= 2; }},

@@ -16,8 +16,8 @@ std::vector<T_FINDING> CheckUlfConstraint(const T_ULFC_D& constraint, int ownKey
                                           const T_MODEL& model);
 
 /// Rules that an item does not keep, its own first, then those of the constraints it names (field
-/// "constraints[NAME].id"). cases: its combination flattened to load cases; nullopt where that
-/// can't be had.
+/// "constraints[NAME].id"). Its name is also that of no construction-stage item. cases: its
+/// combination flattened to load cases; nullopt where that can't be had.
 std::vector<T_FINDING> CheckUlfItem(const T_ULFI_D& item, int ownKey, const T_MODEL& model,
                                     const std::optional<std::vector<T_LCOM_ITEM>>& cases);
 

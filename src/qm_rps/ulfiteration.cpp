@@ -62,18 +62,27 @@ int CUlfIteration::Scale()
     return Stop(ULF_ITER_END::NotScaled);
 }
 
-int CUlfIteration::Analyse()
+int CUlfIteration::Analyse(int iteration)
 {
-    if (!m_host.StartAnalysis()) return Stop(ULF_ITER_END::NotAnalysed);
-    while (m_host.IsExcuted())
+    bool cancelled = false;
+    const bool started = m_host.StartAnalysis() != 0;
+    while (started && m_host.IsExcuted()) {
         m_host.DispatchEvents();
-    return m_host.IsPostMode() ? 1 : Stop(ULF_ITER_END::NotAnalysed);
+        if (cancelled || !m_progress || m_progress(iteration - 1, m_settings.required)) continue;
+        cancelled = true;
+        m_host.CancelAnalysis();
+    }
+    if (started && m_host.IsPostMode()) return 1; // a request that came too late is heard again
+    m_host.UndoEdit();
+    const bool saved = m_host.SaveCopy(m_host.ModelPath()) != 0;
+    return Stop(!cancelled ? ULF_ITER_END::NotAnalysed
+                           : (saved ? ULF_ITER_END::Cancelled : ULF_ITER_END::NotSaved));
 }
 
 int CUlfIteration::Iterate(int iteration)
 {
     if (!m_host.SaveCopy(UlfIterCopyPath(m_model, iteration))) return Stop(ULF_ITER_END::NotSaved);
-    if (!Scale() || !Analyse() || !Solve(iteration)) return 0;
+    if (!Scale() || !Analyse(iteration) || !Solve(iteration)) return 0;
     if (!CLogFile(m_report).Write(UlfIterBlock(m_history.back()))) {
         constexpr const char* key = "IDS_QM_ULF_REPORT_NOT_WRITTEN";
         ShowMessage(key, MMSGFunction::Format(key, {m_report}));

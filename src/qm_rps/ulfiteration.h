@@ -11,12 +11,12 @@ enum class ULF_ITER_END {
     Converged,
     Required,         // the required number of iterations is done
     Declined,         // the person did not ask for (more) iterations
-    Cancelled,        // between iterations
+    Cancelled,        // between iterations, or while an analysis ran
     NotSolved,        // the optimizer found no factors
     ReportNotWritten, // a block of the report
     NotSaved,         // the numbered copy
     NotScaled,        // a pretension load: the edit was cancelled
-    NotAnalysed,      // the analysis did not start, or left no results
+    NotAnalysed,      // the analysis did not start, or left no results: its loads were taken back
 };
 
 struct T_ULF_ITER_SETTINGS {
@@ -36,8 +36,9 @@ public:
     {
     }
 
-    /// Told before each iteration with the number of those done; false cancels the run, the model
-    /// being as after the last complete iteration. Empty: goes on.
+    /// Told before each iteration, and again and again while its analysis runs, with the number of
+    /// those done; false cancels the run, the model and its file being as after the last complete
+    /// iteration. Empty: goes on.
     std::function<bool(int done, int required)> m_progress;
 
     /// 1: converged, or the required number is done, or the person wanted no more; 0: cancelled or
@@ -55,7 +56,7 @@ private:
     [[nodiscard]] int WriteFirst();
     [[nodiscard]] int AskForMore();
     [[nodiscard]] int Scale();
-    [[nodiscard]] int Analyse();
+    [[nodiscard]] int Analyse(int iteration);
     /// 1 one more iteration is to follow; 0 stopped, m_end set.
     [[nodiscard]] int Iterate(int iteration);
 

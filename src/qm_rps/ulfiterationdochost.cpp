@@ -32,6 +32,8 @@ int CUlfIterationDocHost::SaveCopy(const std::string& path)
 
 int CUlfIterationDocHost::StartEdit(const std::string& title)
 {
+    m_isScaled = false;
+    m_before = m_doc.Data().StagedResult();
     return m_doc.Undo().StartEditDB(title);
 }
 
@@ -50,6 +52,7 @@ int CUlfIterationDocHost::ScaleLoad(int loadCase, double factor)
         if (!done)
             return Refuse(MMSGFunction::Format("IDS_QM_ULF_PRETENSION_NOT_CHANGED",
                                                {std::to_string(element), load.name}));
+        m_isScaled = true;
     }
     return 1;
 }
@@ -70,22 +73,37 @@ int CUlfIterationDocHost::CloseEdit()
 void CUlfIterationDocHost::CancelEdit()
 {
     if (m_doc.Edit().IsOpen()) (void)m_doc.Undo().CancelEditDB();
+    m_isScaled = false;
+}
+
+void CUlfIterationDocHost::UndoEdit()
+{
+    if (m_isScaled && m_doc.Undo().Undo()) m_doc.Data().SetStagedResult(m_before);
+    m_isScaled = false;
 }
 
 int CUlfIterationDocHost::StartAnalysis()
 {
     T_ANALYSIS_OPTIONS options;
     options.allCases = false;
-    options.progress = [this](std::size_t, std::size_t) {
-        DispatchEvents();
-        return true;
-    };
     T_ANALYSIS_ERROR error;
-    if (!m_doc.RunAnalysis(options, error)) return Refuse(error.text);
-    return SaveCopy(m_doc.Path());
+    m_isAnalysed = false;
+    return m_doc.StartAnalysis(options, error) ? 1 : Refuse(error.text);
+}
+
+int CUlfIterationDocHost::EndAnalysis()
+{
+    T_ANALYSIS_ERROR error;
+    if (m_doc.AnalysisOutcome(error)) return SaveCopy(m_doc.Path());
+    return error.fault == ANALYSIS_FAULT::Cancelled ? 0 : Refuse(error.text);
 }
 
 void CUlfIterationDocHost::DispatchEvents()
 {
+    constexpr int kWaitMs = 2; // short enough for a window
     if (m_view) m_view->DispatchEvents();
+    if (!m_doc.IsExcuted()) return;
+    if (m_doc.PollAnalysis(kWaitMs)) return;
+    m_isAnalysed = EndAnalysis() != 0;
+    if (m_isAnalysed) m_before = nullptr;
 }

@@ -19,12 +19,17 @@ public:
     [[nodiscard]] int ScalePretension(std::size_t unknown, double factor) override;
     [[nodiscard]] int CloseEdit() override;
     void CancelEdit() override;
-    /// The construction stages; events are dispatched from the analysis' progress. Then the model
-    /// is saved, so that its file has the loads of the results.
+    /// Undoes the edit if it changed a load, and puts the results before the analysis back.
+    void UndoEdit() override;
+    /// The construction stages, in the document's worker.
     [[nodiscard]] int StartAnalysis() override;
     bool IsExcuted() override { return m_doc.IsExcuted(); }
+    void CancelAnalysis() override { m_doc.CancelAnalysis(); }
+    /// Those of the view; waits for the analysis a little. When it has ended the model is saved, so
+    /// that its file has the loads of the results, and the results.
     void DispatchEvents() override;
-    bool IsPostMode() override { return m_doc.IsPostMode(); }
+    /// Also false when the latest analysis failed or its results were not saved.
+    bool IsPostMode() override { return m_isAnalysed && m_doc.IsPostMode(); }
 
     /// Why the latest operation was refused, in words.
     const std::string& Error() const { return m_error; }
@@ -32,9 +37,13 @@ public:
 private:
     [[nodiscard]] int ScaleLoad(int loadCase, double factor);
     int Refuse(const std::string& text);
+    [[nodiscard]] int EndAnalysis();
 
     CDBDoc& m_doc;
     CUnknownStageItemDlg& m_dialog;
     zql::frx::IDialogView* m_view;
     std::string m_error;
+    bool m_isScaled = false;                 // the latest edit has changed a load
+    bool m_isAnalysed = true;                // the latest analysis has its results, in the file too
+    std::shared_ptr<IStagedResult> m_before; // results before the latest edit
 };

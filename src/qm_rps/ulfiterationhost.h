@@ -23,12 +23,16 @@ public:
     [[nodiscard]] virtual int ScalePretension(std::size_t unknown, double factor) = 0;
     [[nodiscard]] virtual int CloseEdit() = 0;
     virtual void CancelEdit() = 0;
+    /// Takes the latest closed edit back, and what an analysis has found since.
+    virtual void UndoEdit() = 0;
 
     /// Starts the analysis; IsExcuted while it runs, DispatchEvents keeps the window alive (all
     /// but closing it and system commands). The model is in post mode once results of it as it is
     /// are there. The host keeps results with the model's file.
     [[nodiscard]] virtual int StartAnalysis() = 0;
     virtual bool IsExcuted() = 0;
+    /// Asks the analysis that is running to end without results; it may have ended already.
+    virtual void CancelAnalysis() = 0;
     virtual void DispatchEvents() = 0;
     virtual bool IsPostMode() = 0;
 };

@@ -61,6 +61,16 @@ double UlfIterTolerance(const std::vector<T_ULF_ITER_ROW>& rows)
     return std::sqrt(sum);
 }
 
+std::vector<double> UlfIterApplied(const std::vector<T_ULF_ITER_STEP>& history)
+{
+    if (history.empty()) return {};
+    std::vector<double> applied(history.back().rows.size(), 1.0);
+    for (std::size_t step = 0; step + 1 < history.size(); ++step)
+        for (std::size_t row = 0; row < applied.size() && row < history[step].rows.size(); ++row)
+            if (history[step].rows[row].pretension) applied[row] *= history[step].rows[row].factor;
+    return applied;
+}
+
 std::string UlfIterHead(int required, double tolerance)
 {
     std::string text = kFrame;

@@ -9,6 +9,7 @@ struct T_ULF_ITER_ROW {
     std::string place; // stage and step, "S1/First Step"
     double factor = 0.0;
     bool pretension = false; // it scales pretension loads
+    std::string load{};      // name of its load case
     bool operator==(const T_ULF_ITER_ROW&) const = default;
 };
 
@@ -23,6 +24,10 @@ struct T_ULF_ITER_STEP {
 
 /// Square root of the sum of (1 - factor)^2 over the unknowns that scale pretension.
 double UlfIterTolerance(const std::vector<T_ULF_ITER_ROW>& rows);
+
+/// By what each row's pretension has been multiplied so far: the factors of every solution but the
+/// latest, which was found with them. 1 for a row that scales none. Empty without a solution.
+std::vector<double> UlfIterApplied(const std::vector<T_ULF_ITER_STEP>& history);
 
 /// Banner and settings.
 std::string UlfIterHead(int required, double tolerance);

@@ -30,9 +30,12 @@ T_ULF_RESULT UlfResultOf(const T_ULF_RUN& run, std::span<const double> factors)
         r.factors[run.formed.unknowns[i]] = factors[i];
     for (const T_ULFC_D& c : run.constraints)
         r.constraints.push_back(UlfResultConstraint(c));
+    for (std::size_t i = 0; i < run.places.size(); ++i)
+        r.constraints[i].place = run.places[i];
     r.influence = run.influence;
     r.exact = run.answer.exact;
     r.code = run.answer.code;
+    r.stage = run.formed.problem.stage;
     return r;
 }
 
@@ -42,6 +45,11 @@ double UlfValue(const T_ULF_RESULT& r, std::size_t constraint)
     for (std::size_t j = 0; j < r.factors.size(); ++j)
         sum += r.influence[constraint][j] * r.factors[j];
     return sum + r.constraints[constraint].constant.value_or(0.0);
+}
+
+std::string UlfNameAt(const std::string& name, const std::string& place)
+{
+    return place.empty() ? name : name + " (" + place + ")";
 }
 
 double UlfScale(const T_ULF_RESULT& r, std::size_t i)
@@ -59,6 +67,7 @@ std::vector<T_ULF_RESULT_ROW> UlfResultRows(const T_ULF_RESULT& r)
     for (std::size_t i = 0; i < r.constraints.size(); ++i) {
         const T_ULF_RESULT_CONSTRAINT& c = r.constraints[i];
         T_ULF_RESULT_ROW row{c.name, c.description, UlfValue(r, i), c.upper, c.lower};
+        row.place = c.place;
         const double scale = UlfScale(r, i);
         const auto at = [&](const std::optional<double>& bound) {
             return bound && std::fabs(row.value - *bound) <= kActiveTolerance * scale;

@@ -9,27 +9,30 @@ struct T_ULF_RESULT_CONSTRAINT {
     std::optional<double> upper, lower; // an equality has its value as both
     /// What cases outside the table contribute; in a static analysis all cases stand in the table.
     std::optional<double> constant{};
+    std::string place{}; // stage and step where it is read, of one that names them
     bool operator==(const T_ULF_RESULT_CONSTRAINT&) const = default;
 };
 
 struct T_ULF_RESULT {
     T_ULFI_D item;
-    std::vector<T_ULF_CASE> cases;                    // of the item's combination, in order
+    std::vector<T_ULF_CASE> cases;                    // of the combination, or the item's rows
     std::vector<double> factors;                      // per case: solved or known
     std::vector<T_ULF_RESULT_CONSTRAINT> constraints; // one per user constraint
     std::vector<std::vector<double>> influence;       // per constraint: response of every case
     bool exact = false;                               // solved as equations
     int code = 0;                                     // of the solver
+    bool stage = false; // the cases are loads at a construction stage and step
 };
 
 /// One calculation of an item: what went into the optimizer and what came out.
 struct T_ULF_RUN {
     T_ULFI_D item;
-    std::vector<T_ULF_CASE> cases;     // of the item's combination, in order
+    std::vector<T_ULF_CASE> cases;     // as in the result
     std::vector<T_ULFC_D> constraints; // that take part, in the document's current units
     T_ULF_FORMED formed;
     T_OPT_ANSWER answer;
     std::vector<std::vector<double>> influence; // per constraint: response of every case
+    std::vector<std::string> places{};          // of the constraints; empty in a static analysis
 };
 
 /// The result set of a run with these factors, one per unknown: the solved ones, or others to be
@@ -46,6 +49,7 @@ struct T_ULF_RESULT_ROW {
     double residual = 0.0;
     bool active = false; // at a bound, to 1e-8 of the row's scale
     bool met = true;     // residual within 1e-6 of the row's scale
+    std::string place{}; // as of the constraint
     bool operator==(const T_ULF_RESULT_ROW&) const = default;
 };
 
@@ -55,6 +59,9 @@ T_ULF_RESULT_CONSTRAINT UlfResultConstraint(const T_ULFC_D& constraint);
 
 /// Value of constraint i: influence times factors, and the constant. The sum runs in case order.
 double UlfValue(const T_ULF_RESULT& result, std::size_t constraint);
+
+/// A constraint's name with its place, "HOLD (S1/Last Step)".
+std::string UlfNameAt(const std::string& name, const std::string& place);
 
 /// What is small in the row of constraint i: its scale.
 double UlfScale(const T_ULF_RESULT& result, std::size_t constraint);

@@ -67,7 +67,7 @@ void PutConstraint(CWriter& put, const T_ULF_RESULT& r, std::size_t i)
 {
     const T_ULF_RESULT_CONSTRAINT& c = r.constraints[i];
     const std::size_t column = kFirstColumn + i;
-    put.PutCentred(kNameRow, column, c.name);
+    put.PutCentred(kNameRow, column, UlfNameAt(c.name, c.place));
     if (c.upper) put.Put(kUpperRow, column, *c.upper);
     if (c.lower) put.Put(kLowerRow, column, *c.lower);
     put.Put(kValueRow, column, ValueFormula(r, i));

@@ -32,6 +32,21 @@ int UlfStepNumber(const T_MODEL& model, int stage, int step)
     return number <= kStageStepsMost ? number : 0;
 }
 
+std::string UlfPlaceText(const CDataCtrl& data, int stage, int step)
+{
+    T_STAG_STEP_INFO info;
+    return CAttrCtrl(data).GetStagStepInfo(stage, step, info) ? info.Text() : std::string();
+}
+
+std::string UlfStageRowText(const CDataCtrl& data, const T_ULSI_ROW& row)
+{
+    std::string text = UlfPlaceText(data, row.stage, row.step);
+    const auto& cases = data.Model().loadCases;
+    if (const auto it = cases.find(row.loadCase); it != cases.end())
+        text += (text.empty() ? "" : " ") + it->second.name;
+    return text;
+}
+
 std::vector<int> LoadsActingAt(const T_MODEL& model, int stage, int step)
 {
     std::vector<int> acting;

@@ -1,7 +1,7 @@
 // Stage and step as one number, and what acts there.
 #pragma once
 
-#include "qm_db/records.h"
+#include "qm_db/attrctrl.h"
 
 /// Steps of a stage that a stage number can tell apart.
 inline constexpr int kStageStepsMost = 999;
@@ -14,6 +14,11 @@ int StepOfUlfNumber(int number); // kStageLastStep for the last one
 
 /// The step's number in its stage: the last one is the number of steps. 0: no such stage or step.
 int UlfStepNumber(const T_MODEL& model, int stage, int step);
+
+/// "S1/First Step"; empty where there is no such stage or step.
+std::string UlfPlaceText(const CDataCtrl& data, int stage, int step);
+/// Place and load case of a row, "S1/First Step T"; what is gone is left out.
+std::string UlfStageRowText(const CDataCtrl& data, const T_ULSI_ROW& row);
 
 /// Load cases that the stage brings at this step or before and has not taken away by then, in the
 /// stage's order.

@@ -2,7 +2,6 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_rps/ulfchecks.h"
-#include "qm_rps/ulfrecords.h"
 #include "qm_rps/ulfstageplace.h"
 
 #include <algorithm>
@@ -19,72 +18,42 @@ struct T_ITEM_CHECK {
     const T_MODEL& model;
     int ownKey;
 };
+struct T_ROW_CHECK {
+    const T_ULSI_ROW& row;
+    const T_MODEL& model;
+    bool twice;  // a row before it is the same load at the same stage and step
+    bool shared; // a row before it scales some of its pretension loads
+};
 using I = T_ITEM_CHECK;
+using R = T_ROW_CHECK;
 constexpr auto kKey = RULE_TEXT::Key;
 constexpr auto kLit = RULE_TEXT::Literal;
 
-template <class F>
-bool EveryRow(const I& k, F holds)
-{
-    return std::ranges::all_of(k.item.rows, holds);
-}
-
 bool NameIsFree(const I& k)
 {
-    return std::ranges::none_of(k.model.ulfStageItems, [&](const auto& entry) {
-        return entry.first != k.ownKey && entry.second.name == k.item.name;
-    });
+    const auto others = [&](const auto& table, int ownKey) {
+        return std::ranges::any_of(table, [&](const auto& entry) {
+            return entry.first != ownKey && entry.second.name == k.item.name;
+        });
+    };
+    return !others(k.model.ulfStageItems, k.ownKey) && !others(k.model.ulfItems, 0);
 }
-bool PlacesExist(const I& k)
+bool NumbersAreFinite(const R& k)
 {
-    return EveryRow(k, [&](const auto& r) { return UlfStepNumber(k.model, r.stage, r.step) != 0; });
+    return k.row.unknown ? std::isfinite(k.row.weight) && k.row.weight >= 0
+                         : std::isfinite(k.row.factor);
 }
-bool CasesExist(const I& k)
+bool HasPretension(const T_MODEL& model, int loadCase)
 {
-    return EveryRow(k, [&](const auto& r) { return k.model.loadCases.contains(r.loadCase); });
-}
-bool GroupsExist(const I& k)
-{
-    return EveryRow(k, [](const auto& r) {
-        return r.loadGroup >= kLoadGroupDead && r.loadGroup <= kLoadGroupRest;
-    });
-}
-bool NumbersAreFinite(const I& k)
-{
-    return EveryRow(k, [](const auto& r) {
-        return r.unknown ? std::isfinite(r.weight) && r.weight >= 0 : std::isfinite(r.factor);
-    });
-}
-bool RowsDiffer(const I& k)
-{
-    std::set<std::tuple<int, int, int>> seen;
-    return EveryRow(k, [&](const auto& r) {
-        return seen.insert({r.stage, r.step, r.loadCase}).second;
-    });
-}
-bool HasPretension(const I& k, int loadCase)
-{
-    const auto it = k.model.loadCases.find(loadCase);
-    return it != k.model.loadCases.end() && !it->second.pretension.empty();
+    const auto it = model.loadCases.find(loadCase);
+    return it != model.loadCases.end() && !it->second.pretension.empty();
 }
 /// An unknown that is to scale pretension must find some, else it would never get to 1.
-bool PretensionIsThere(const I& k)
+bool PretensionIsThere(const R& k)
 {
-    return EveryRow(k, [&](const T_ULSI_ROW& r) {
-        return !r.unknown || !r.pretension ||
-               std::ranges::any_of(LoadsScaledBy(k.model, r),
-                                   [&](int load) { return HasPretension(k, load); });
-    });
-}
-/// Scaled by two unknowns, a load would get both factors.
-bool ScaledOnce(const I& k)
-{
-    std::set<int> seen;
-    return EveryRow(k, [&](const T_ULSI_ROW& r) {
-        return std::ranges::all_of(LoadsScaledBy(k.model, r), [&](int load) {
-            return !HasPretension(k, load) || seen.insert(load).second;
-        });
-    });
+    return !k.row.unknown || !k.row.pretension ||
+           std::ranges::any_of(LoadsScaledBy(k.model, k.row),
+                               [&](int load) { return HasPretension(k.model, load); });
 }
 bool HasUnknown(const I& k)
 {
@@ -112,25 +81,75 @@ bool ConstraintPlacesExist(const I& k)
 }
 
 // clang-format off
-const T_RULE<I> kRules[] = {
+const T_RULE<I> kNameRules[] = {
     {{"IDS_RPS_No_Item_Name_", kLit, nullptr, nullptr, "name"}, [](const I& k) { return !k.item.name.empty(); }},
     {{kUlfItemError, kKey, "IDS_QM_ULFI_NAME_EXISTS", nullptr, "name"}, NameIsFree, [](const I& k) { return !k.item.name.empty(); }},
-    {{kUlfItemError, kKey, "IDS_QM_ULSI_PLACE", nullptr, "rows"}, PlacesExist},
-    {{kUlfItemError, kKey, "IDS_QM_ULSI_CASE", nullptr, "rows"}, CasesExist},
-    {{kUlfItemError, kKey, "IDS_QM_ULSI_GROUP", nullptr, "rows"}, GroupsExist},
-    {{kUlfItemError, kKey, "IDS_QM_ULSI_NUMBER", nullptr, "rows"}, NumbersAreFinite},
-    {{kUlfItemError, kKey, "IDS_QM_ULSI_TWICE", nullptr, "rows"}, RowsDiffer},
+};
+const T_RULE<R> kRowRules[] = {
+    {{kUlfItemError, kKey, "IDS_QM_ULSI_PLACE", nullptr, "step"}, [](const R& k) { return UlfStepNumber(k.model, k.row.stage, k.row.step) != 0; }},
+    {{kUlfItemError, kKey, "IDS_QM_ULSI_CASE", nullptr, "case"}, [](const R& k) { return k.model.loadCases.contains(k.row.loadCase); }},
+    {{kUlfItemError, kKey, "IDS_QM_ULSI_GROUP", nullptr, "load_group"}, [](const R& k) { return k.row.loadGroup >= kLoadGroupDead && k.row.loadGroup <= kLoadGroupRest; }},
+    {{kUlfItemError, kKey, "IDS_QM_ULSI_NUMBER", nullptr, "factor"}, NumbersAreFinite},
+    {{kUlfItemError, kKey, "IDS_QM_ULSI_TWICE", nullptr, "case"}, [](const R& k) { return !k.twice; }},
+    {{kUlfItemError, kKey, "IDS_QM_ULSI_NO_PRETENSION", nullptr, "pretension"}, PretensionIsThere},
+    // Scaled by two unknowns, a load would get both factors.
+    {{kUlfItemError, kKey, "IDS_QM_ULSI_SCALED_TWICE", nullptr, "pretension"}, [](const R& k) { return !k.shared; }},
+};
+const T_RULE<I> kRules[] = {
     {{kUlfItemError, kKey, "IDS_QM_ULFI_OBJECTIVE", nullptr, "objective"}, [](const I& k) { return k.item.objective >= 0 && k.item.objective <= 2; }},
     {{kUlfItemError, kKey, "IDS_QM_ULFI_SIGN", nullptr, "sign"}, [](const I& k) { return k.item.sign >= 0 && k.item.sign <= 2; }},
     {{"IDS_RPS_No_Unknown_Load_Factor_defined_", kLit, nullptr, nullptr, "rows"}, HasUnknown},
-    {{kUlfItemError, kKey, "IDS_QM_ULSI_NO_PRETENSION", nullptr, "rows"}, PretensionIsThere},
-    {{kUlfItemError, kKey, "IDS_QM_ULSI_SCALED_TWICE", nullptr, "rows"}, ScaledOnce},
     {{"IDS_RPS_No_constraint_defined_for_the_unknowns_", kLit, nullptr, nullptr, "constraints"}, [](const I& k) { return !k.item.constraints.empty(); }},
     {{kUlfItemError, kKey, "IDS_QM_ULFI_NO_SUCH_CONSTRAINT", nullptr, "constraints"}, ConstraintsExist},
     {{kUlfItemError, kKey, "IDS_QM_ULFI_TWICE", nullptr, "constraints"}, ConstraintsDiffer},
     {{kUlfItemError, kKey, "IDS_QM_ULSI_CONSTRAINT_PLACE", nullptr, "constraints"}, ConstraintPlacesExist},
 };
 // clang-format on
+
+/// What each row says, with what the rows before it have taken.
+void CheckRows(const T_ULSI_D& item, const CDataCtrl& data, std::vector<T_FINDING>& out)
+{
+    const T_MODEL& model = data.Model();
+    std::set<std::tuple<int, int, int>> places; // stage, step, case
+    std::set<int> scaled;
+    for (std::size_t i = 0; i < item.rows.size(); ++i) {
+        const T_ULSI_ROW& row = item.rows[i];
+        // The last step and its number are one place.
+        const int step = UlfStepNumber(model, row.stage, row.step);
+        R check{row, model, false, false};
+        check.twice = step && !places.insert({row.stage, step, row.loadCase}).second;
+        for (const int load : LoadsScaledBy(model, row))
+            if (HasPretension(model, load)) check.shared |= !scaled.insert(load).second;
+        const std::string number = std::to_string(i + 1);
+        std::vector<T_FINDING> found;
+        WalkRules(std::span<const T_RULE<R>>(kRowRules), check,
+                  {-1, {}, -1, "rows[" + number + "]."}, found);
+        for (T_FINDING& f : found) {
+            const std::string rule =
+                MMSGFunction::Format("IDS_QM_ULSI_ROW", {number, UlfStageRowText(data, row),
+                                                         MMSGFunction::GetValue(f.ruleText)});
+            f.text = MMSGFunction::Format(f.messageKey, {item.name, rule});
+            out.push_back(std::move(f));
+        }
+    }
+}
+
+void CheckItem(std::span<const T_RULE<I>> rules, const I& check, std::vector<T_FINDING>& out)
+{
+    std::vector<T_FINDING> found;
+    WalkRules(rules, check, {}, found);
+    for (T_FINDING& f : found) {
+        f.text = MMSGFunction::Format(f.messageKey,
+                                      {check.item.name, MMSGFunction::GetValue(f.ruleText)});
+        out.push_back(std::move(f));
+    }
+}
+
+T_OPT_ITEM RecordOf(const T_ULSI_ROW& row)
+{
+    return {double(UlfStageNumber(row.stage, row.step)), row.unknown ? 0.0 : row.factor,
+            row.unknown ? row.weight : 1.0, double(row.loadGroup)};
+}
 
 } // namespace
 
@@ -141,9 +160,7 @@ T_ULF_STAGE_FORMED FormUlfStageProblem(const T_ULSI_D& item, std::span<const T_U
     p.stage = true;
     for (std::size_t i = 0; i < item.rows.size(); ++i) {
         const T_ULSI_ROW& row = item.rows[i];
-        const T_OPT_ITEM record{double(UlfStageNumber(row.stage, row.step)),
-                                row.unknown ? 0.0 : row.factor, row.unknown ? row.weight : 1.0,
-                                double(row.loadGroup)};
+        const T_OPT_ITEM record = RecordOf(row);
         if (!row.unknown && IsUnknownItem(record)) continue;
         p.items.push_back(record);
         formed.loads.push_back(row.loadCase);
@@ -163,6 +180,24 @@ T_ULF_STAGE_FORMED FormUlfStageProblem(const T_ULSI_D& item, std::span<const T_U
     return formed;
 }
 
+int ReadUlfStageInfluence(const T_ULSI_D& item, const T_ULF_FORMED& formed,
+                          CUlfStageResponse& source, std::vector<std::vector<double>>& influence)
+{
+    std::vector<T_OPT_ITEM> items;
+    source.m_loads.clear();
+    for (const T_ULSI_ROW& row : item.rows) {
+        items.push_back(RecordOf(row));
+        source.m_loads.push_back(row.loadCase);
+    }
+    std::vector<T_OPT_ROW> rows;
+    std::vector<std::vector<double>> read;
+    if (!BuildRows(items, formed.problem.constraints, source, rows, read)) return 0;
+    influence.resize(formed.owner.empty() ? 0 : formed.owner.back() + 1);
+    for (std::size_t i = 0; i < read.size(); ++i) // two bounds have the same responses
+        influence[formed.owner[i]] = std::move(read[i]);
+    return 1;
+}
+
 std::vector<int> LoadsScaledBy(const T_MODEL& model, const T_ULSI_ROW& row)
 {
     if (!row.unknown || !row.pretension) return {};
@@ -170,14 +205,14 @@ std::vector<int> LoadsScaledBy(const T_MODEL& model, const T_ULSI_ROW& row)
     return LoadsActingAt(model, row.stage, row.step);
 }
 
-std::vector<T_FINDING> CheckUlfStageItem(const T_ULSI_D& item, int ownKey, const T_MODEL& model)
+std::vector<T_FINDING> CheckUlfStageItem(const T_ULSI_D& item, int ownKey, const CDataCtrl& data)
 {
     std::vector<T_FINDING> out;
-    WalkRules(std::span<const T_RULE<I>>(kRules), {item, model, ownKey}, {}, out);
-    for (T_FINDING& f : out)
-        f.text =
-            MMSGFunction::Format(f.messageKey, {item.name, MMSGFunction::GetValue(f.ruleText)});
+    const I check{item, data.Model(), ownKey};
+    CheckItem(kNameRules, check, out);
+    CheckRows(item, data, out);
+    CheckItem(kRules, check, out);
     for (const std::string& name : item.constraints)
-        AddConstraintFindings(name, model, out);
+        AddConstraintFindings(name, data.Model(), out);
     return out;
 }

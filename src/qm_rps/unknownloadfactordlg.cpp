@@ -1,6 +1,7 @@
 #include "qm_rps/unknownloadfactordlg.h"
 
 #include "qm_rps/unknownloadfactoritemdlg.h"
+#include "qm_rps/unknownstageitemdlg.h"
 
 std::vector<CUnknownLoadFactorDlg::T_ROW> CUnknownLoadFactorDlg::Rows() const
 {
@@ -11,14 +12,28 @@ std::vector<CUnknownLoadFactorDlg::T_ROW> CUnknownLoadFactorDlg::Rows() const
         const bool known = it != model.combinations.end();
         rows.push_back({key, item.name, known ? it->second.name : std::string()});
     }
+    for (const auto& [key, item] : model.ulfStageItems)
+        rows.push_back({key, item.name, {}, true});
     return rows;
 }
 
 int CUnknownLoadFactorDlg::CheckData()
 {
-    if (m_doc.Data().Model().ulfItems.contains(m_selected)) return 1;
+    const T_MODEL& model = m_doc.Data().Model();
+    if (m_stage ? model.ulfStageItems.contains(m_selected) : model.ulfItems.contains(m_selected))
+        return 1;
     ShowMessage("IDS_RPS_ULFD_MODIFY_DATA_NON_EXIST");
     return 0;
+}
+
+template <class DIALOG>
+int CUnknownLoadFactorDlg::Show(DIALOG&& dialog, bool stage)
+{
+    dialog.SetView(View());
+    if (!dialog.DoModal()) return 0;
+    m_selected = dialog.Key();
+    m_stage = stage;
+    return 1;
 }
 
 int CUnknownLoadFactorDlg::OnAdd()
@@ -27,30 +42,41 @@ int CUnknownLoadFactorDlg::OnAdd()
         ShowMessage("IDS_RPS_No_General_Load_Combination_exist_");
         return 0;
     }
-    CUnknownLoadFactorItemDlg dlg(m_doc);
-    dlg.SetView(View());
-    if (!dlg.DoModal()) return 0;
-    m_selected = dlg.Key();
-    return 1;
+    return Show(CUnknownLoadFactorItemDlg(m_doc), false);
+}
+
+int CUnknownLoadFactorDlg::OnAddStage()
+{
+    if (m_doc.Data().Model().stages.empty()) {
+        ShowMessage("IDS_QM_ULSI_NO_STAGES");
+        return 0;
+    }
+    return Show(CUnknownStageItemDlg(m_doc, m_results), true);
 }
 
 int CUnknownLoadFactorDlg::OnModify()
 {
     if (!CheckData()) return 0;
-    CUnknownLoadFactorItemDlg dlg(m_doc, m_selected);
-    dlg.SetView(View());
-    return dlg.DoModal();
+    return m_stage ? Show(CUnknownStageItemDlg(m_doc, m_results, m_selected), true)
+                   : Show(CUnknownLoadFactorItemDlg(m_doc, m_selected), false);
 }
 
-int CUnknownLoadFactorDlg::OnDelete()
+template <class T>
+int CUnknownLoadFactorDlg::Delete(const T_TABLE<T>& table)
 {
-    if (!CheckData()) return 0;
     CEditData& edit = m_doc.Edit();
-    if (!edit.Begin(m_doc.Data().Model().ulfItems.at(m_selected).name)) return 0;
-    if (!edit.Erase<T_ULFI_D>(m_selected) || !edit.Commit()) {
+    if (!edit.Begin(table.at(m_selected).name)) return 0;
+    if (!edit.Erase<T>(m_selected) || !edit.Commit()) {
         edit.Rollback();
         return 0;
     }
     m_selected = 0;
     return 1;
+}
+
+int CUnknownLoadFactorDlg::OnDelete()
+{
+    if (!CheckData()) return 0;
+    const T_MODEL& model = m_doc.Data().Model();
+    return m_stage ? Delete(model.ulfStageItems) : Delete(model.ulfItems);
 }

@@ -1,27 +1,9 @@
 #include "qm_rps/unknownloadfactoritemdlg.h"
 
-#include "qm_base/messagehistory.h"
-#include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/ulfchecks.h"
 
 #include <algorithm>
-
-using zql::lib::MMSGFunction;
-
-namespace {
-
-std::string Flag(bool on)
-{
-    return on ? "1" : "0";
-}
-
-void WriteHistory(const char* key)
-{
-    GSaveHistoryFormatNF("%s", MMSGFunction::GetValue(key).c_str());
-}
-
-} // namespace
 
 CUnknownLoadFactorItemDlg::CUnknownLoadFactorItemDlg(CDBDoc& doc, int key)
     : m_doc(doc), m_key(key), m_source(doc),
@@ -55,15 +37,7 @@ void CUnknownLoadFactorItemDlg::Data2Dlg(const T_ULFI_D& item)
     m_strangers = item.unknowns;
     OnSelChangeCombination(item.combination);
 
-    m_checks.clear();
-    m_missing.clear();
-    for (const auto& [key, constraint] : m_doc.Data().Model().ulfConstraints) {
-        const auto& names = item.constraints;
-        const bool checked = std::find(names.begin(), names.end(), constraint.name) != names.end();
-        m_checks.push_back({constraint.name, checked});
-    }
-    for (const std::string& name : item.constraints)
-        if (FindUlfConstraint(m_doc.Data().Model(), name) == 0) m_missing.push_back(name);
+    SetChecks(m_doc.Data().Model(), item.constraints, false);
 }
 
 void CUnknownLoadFactorItemDlg::OnSelChangeCombination(int key)
@@ -94,9 +68,7 @@ T_ULFI_D CUnknownLoadFactorItemDlg::Record() const
     for (const T_ULF_CASE& c : m_cases)
         if (c.unknown) item.unknowns.push_back({c.key, c.weight});
     item.unknowns.insert(item.unknowns.end(), m_strangers.begin(), m_strangers.end());
-    for (const T_CHECK& check : m_checks)
-        if (check.checked) item.constraints.push_back(check.name);
-    item.constraints.insert(item.constraints.end(), m_missing.begin(), m_missing.end());
+    item.constraints = CheckedNames();
     return item;
 }
 
@@ -167,19 +139,14 @@ int CUnknownLoadFactorItemDlg::ReadRun(T_ULF_RUN& run) const
 {
     run.item = Record();
     run.cases = m_cases;
-    for (const std::string& name : run.item.constraints) {
-        T_ULFC_D constraint;
-        if (!m_doc.Attr().GetUlfc_(name, constraint)) return 0;
-        run.constraints.push_back(std::move(constraint));
-    }
+    if (!ReadConstraints(m_doc, run)) return 0;
     run.formed = FormUlfProblem(run.item, run.cases, run.constraints);
     return 1;
 }
 
 int CUnknownLoadFactorItemDlg::OnCalculate()
 {
-    m_result.reset();
-    m_run.reset();
+    Forget();
     T_ULF_RUN run;
     if (!CheckData() || !ReadRun(run)) return 0;
 
@@ -190,40 +157,5 @@ int CUnknownLoadFactorItemDlg::OnCalculate()
     const bool found = optimizer.Run(run.formed.problem, run.answer) != 0;
     const bool solved =
         ReadUlfInfluence(run.cases, run.constraints, m_cache, run.influence) && found;
-    m_run = run;
-    if (!solved) {
-        constexpr const char* key = "IDS_RPS_Unknown_Load_Factor_Item_has_an_error";
-        ShowMessage(key, MMSGFunction::Format(key, {m_name, FailureText(run)}));
-        WriteHistory("IDS_RPS_Unknown_CANNOT_FIND_OPTIMIZED_SOLUTION");
-        return 0;
-    }
-    m_result = UlfResultOf(run, run.answer.factors);
-    WriteHistory("IDS_RPS_Unknown_CAN_FIND_OPTIMIZED_SOLUTION");
-    ReportMisses();
-    return 1;
-}
-
-/// The optimizer's message with the name of the constraint or load case that it numbers.
-std::string CUnknownLoadFactorItemDlg::FailureText(const T_ULF_RUN& run) const
-{
-    const T_OPT_ANSWER& a = run.answer;
-    if (a.message.empty()) return m_cache.Error();
-    std::string name;
-    if (a.constraint > 0)
-        name = run.constraints[run.formed.owner[static_cast<std::size_t>(a.constraint - 1)]].name;
-    else if (a.factor > 0)
-        name = run.cases[run.formed.unknowns[static_cast<std::size_t>(a.factor - 1)]].name;
-    return name.empty() ? a.message : a.message + " (" + name + ")";
-}
-
-void CUnknownLoadFactorItemDlg::ReportMisses()
-{
-    std::string names;
-    for (const T_ULF_RESULT_ROW& row : UlfResultRows(*m_result))
-        if (!row.met) names += (names.empty() ? "" : ", ") + row.name;
-    if (names.empty()) return;
-    constexpr const char* key = "IDS_QM_ULF_NOT_MET";
-    const std::string text = MMSGFunction::Format(key, {names});
-    ShowMessage(key, text);
-    GSaveHistoryFormatNF("%s", text.c_str());
+    return Finish(std::move(run), solved, m_cache.Error());
 }

@@ -2,30 +2,17 @@
 // constraints, and the calculation of its factors.
 #pragma once
 
-#include "qm_db/dbdoc.h"
-#include "qm_rps/hingedialog.h"
 #include "qm_rps/ulfinfluencecache.h"
-#include "qm_rps/ulfresult.h"
+#include "qm_rps/ulfitemdialog.h"
 #include "qm_rps/ulfstaticresponse.h"
 
-class CUnknownLoadFactorItemDlg : public CHingeDialog {
+class CUnknownLoadFactorItemDlg : public CUlfItemDialog {
 public:
     /// Columns of the load case grid; flags are "1" and "0".
     enum COLUMN { LoadCase, Unknown, Known, Factor, Weight };
     static constexpr std::array<const char*, 5> kHeads{
         "IDS_RPS_GXGRID_LCase", "IDS_RPS_GXGRID_Unknown", "IDS_RPS_GXGRID_known",
         "IDS_RPS_GXGRID_Factor", "IDS_RPS_GXGRID_Weighted_Factor"};
-    /// Texts of the choices, by index.
-    static constexpr std::array<const char*, 3> kObjectiveKeys{
-        "IDS_QM_ULF_LINEAR", "IDS_QM_ULF_SQUARE", "IDS_QM_ULF_MIN_MAX"};
-    static constexpr std::array<const char*, 3> kSignKeys{"IDS_QM_ULF_NEGATIVE", "IDS_QM_ULF_FREE",
-                                                          "IDS_QM_ULF_POSITIVE"};
-
-    struct T_CHECK {
-        std::string name; // of a constraint of the model
-        bool checked = false;
-        bool operator==(const T_CHECK&) const = default;
-    };
 
     /// The document must outlive the dialog. key: of the item to edit, 0 for a new one, which
     /// starts with the model's first combination.
@@ -36,12 +23,6 @@ public:
     T_ULFI_D Record() const;
     /// Checks, then writes. 0: a message was shown, `item` as it was.
     [[nodiscard]] int Dlg2Data(T_ULFI_D& item);
-
-    std::string m_name;
-    int m_objective = 0; // index of kObjectiveKeys
-    int m_sign = 1;      // index of kSignKeys
-    bool m_solveByEquations = false;
-    std::vector<T_CHECK> m_checks; // all constraints of the model
 
     int Combination() const { return m_combination; }
     /// Another combination: its load cases; flags and weights of cases that both have stay.
@@ -60,30 +41,19 @@ public:
     int OnOK() override;
     int Key() const { return m_key; }
 
-    /// The calculation. 1: Result() has the factors; constraints that equations could not meet to
-    /// 1e-6 are named in a message. 0: refused or not solved, with a message, and no result kept.
-    /// Either outcome goes to the message history.
-    [[nodiscard]] int OnCalculate();
-    const std::optional<T_ULF_RESULT>& Result() const { return m_result; }
-    /// Of the latest calculation that reached the optimizer, for its explanation.
-    const std::optional<T_ULF_RUN>& LastRun() const { return m_run; }
+    [[nodiscard]] int OnCalculate() override;
 
     bool m_dump = false; // debug: write the problem handed to the solver beside the model file
 
 private:
     std::optional<T_LCOM_D> Normalised(int combination) const;
     int ReadRun(T_ULF_RUN& run) const;
-    std::string FailureText(const T_ULF_RUN& run) const;
-    void ReportMisses();
 
     CDBDoc& m_doc;
     int m_key = 0;
     int m_combination = 0;
     std::vector<T_ULF_CASE> m_cases;
     std::vector<T_ULFI_UNKNOWN> m_strangers; // unknown cases that the combination does not have
-    std::vector<std::string> m_missing;      // constraints that the item names and the model lacks
     CUlfStaticResponse m_source;
     CUlfInfluenceCache m_cache;
-    std::optional<T_ULF_RUN> m_run;
-    std::optional<T_ULF_RESULT> m_result;
 };

@@ -37,6 +37,7 @@ int CUnknownLoadFactorResultDlg::OnExport(const std::string& path,
 
 int CUnknownLoadFactorResultDlg::CheckData()
 {
+    if (m_result.stage) return Refuse("IDS_QM_ULSI_NO_COMBINATION", m_result.item.name);
     if (m_combinationName.empty()) return Refuse("IDS_RPS_UNKNOWN_LOAD_NAME_NOTENTERED");
     if (m_doc.Attr().ExistLcom(m_combinationName))
         return Refuse("IDS_RPS_UNKNOWN_LOAD_LCOM_EXIST", m_combinationName);

@@ -1,9 +1,8 @@
 #include "qm_rps/unknownstageitemdlg.h"
 
-#include "qm_base/messagehistory.h"
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
-#include "qm_rps/ulfchecks.h"
+#include "qm_rps/ulfstageplace.h"
 
 #include <algorithm>
 
@@ -11,22 +10,10 @@ using zql::lib::MMSGFunction;
 
 namespace {
 
-std::string Flag(bool on)
-{
-    return on ? "1" : "0";
-}
-
 std::string CaseName(const T_MODEL& model, int key)
 {
     const auto it = model.loadCases.find(key);
     return it == model.loadCases.end() ? std::string() : it->second.name;
-}
-
-/// "S1/First Step"; empty for a place that is gone.
-std::string PlaceName(CDBDoc& doc, const T_ULSI_ROW& row)
-{
-    T_STAG_STEP_INFO info;
-    return doc.Attr().GetStagStepInfo(row.stage, row.step, info) ? info.Text() : std::string();
 }
 
 } // namespace
@@ -47,28 +34,13 @@ void CUnknownStageItemDlg::Data2Dlg(const T_ULSI_D& item)
     m_sign = item.sign;
     m_solveByEquations = item.solveByEquations;
     m_rows = item.rows;
-    m_checks.clear();
-    m_missing.clear();
-    const T_MODEL& model = m_doc.Data().Model();
     // The item's own ones first, in its order, so that a calculation keeps that order.
-    for (const std::string& name : item.constraints) {
-        if (FindUlfConstraint(model, name) == 0)
-            m_missing.push_back(name);
-        else
-            m_checks.push_back({name, true});
-    }
-    for (const auto& [key, constraint] : model.ulfConstraints)
-        if (std::ranges::find(item.constraints, constraint.name) == item.constraints.end())
-            m_checks.push_back({constraint.name, false});
+    SetChecks(m_doc.Data().Model(), item.constraints, true);
 }
 
 T_ULSI_D CUnknownStageItemDlg::Record() const
 {
-    T_ULSI_D item{m_name, m_rows, m_objective, m_sign, m_solveByEquations, {}};
-    for (const T_CHECK& check : m_checks)
-        if (check.checked) item.constraints.push_back(check.name);
-    item.constraints.insert(item.constraints.end(), m_missing.begin(), m_missing.end());
-    return item;
+    return {m_name, m_rows, m_objective, m_sign, m_solveByEquations, CheckedNames()};
 }
 
 int CUnknownStageItemDlg::Dlg2Data(T_ULSI_D& item)
@@ -85,7 +57,7 @@ std::string CUnknownStageItemDlg::CellText(std::size_t row, COLUMN column) const
     const T_MODEL& model = m_doc.Data().Model();
     switch (column) {
     case Stage:
-        return PlaceName(m_doc, r);
+        return UlfPlaceText(m_doc.Data(), r.stage, r.step);
     case LoadCase:
         return CaseName(model, r.loadCase);
     case Unknown:
@@ -123,7 +95,7 @@ int CUnknownStageItemDlg::SetCell(std::size_t row, COLUMN column, const std::str
 
 std::vector<T_FINDING> CUnknownStageItemDlg::Findings() const
 {
-    return CheckUlfStageItem(Record(), m_key, m_doc.Data().Model());
+    return CheckUlfStageItem(Record(), m_key, m_doc.Data());
 }
 
 int CUnknownStageItemDlg::OnOK()
@@ -142,85 +114,61 @@ int CUnknownStageItemDlg::OnOK()
     return 1;
 }
 
-int CUnknownStageItemDlg::ReadConstraints(const T_ULSI_D& item)
+std::array<CUnknownStageItemDlg::T_SUMMARY, 3> CUnknownStageItemDlg::Summary() const
 {
-    m_constraints.clear();
-    for (const std::string& name : item.constraints) {
-        T_ULFC_D constraint;
-        if (!m_doc.Attr().GetUlfc_(name, constraint)) return 0;
-        m_constraints.push_back(std::move(constraint));
+    std::array<T_SUMMARY, 3> summary{{{"IDS_RPS_DL"}, {"IDS_RPS_ER"}, {"IDS_RPS_SUM"}}};
+    const auto count = [](T_SUMMARY& s, const T_ULSI_ROW& row) {
+        ++s.rows;
+        s.unknowns += row.unknown ? 1 : 0;
+    };
+    for (const T_ULSI_ROW& row : m_rows) {
+        if (row.loadGroup == kLoadGroupDead) count(summary[0], row);
+        if (row.loadGroup == kLoadGroupErection) count(summary[1], row);
+        count(summary[2], row);
     }
+    return summary;
+}
+
+int CUnknownStageItemDlg::ReadRun(T_ULF_RUN& run, T_ULSI_D& item)
+{
+    item = Record();
+    run.item.name = item.name;
+    run.item.objective = item.objective;
+    run.item.sign = item.sign;
+    run.item.solveByEquations = item.solveByEquations;
+    run.item.constraints = item.constraints;
+    for (const T_ULSI_ROW& row : item.rows)
+        run.cases.push_back({row.loadCase, UlfStageRowText(m_doc.Data(), row), row.factor,
+                             row.unknown, row.weight});
+    if (!ReadConstraints(m_doc, run)) return 0;
+    for (const T_ULFC_D& c : run.constraints)
+        run.places.push_back(c.stage ? UlfPlaceText(m_doc.Data(), c.stage, c.step) : std::string());
     return 1;
 }
 
 int CUnknownStageItemDlg::OnCalculate()
 {
-    m_result.reset();
-    m_answer = {};
-    const T_ULSI_D item = Record();
-    if (!CheckData() || !ReadConstraints(item)) return 0;
-    m_formed = FormUlfStageProblem(item, m_constraints);
-    m_source.m_loads = m_formed.loads;
+    Forget();
+    T_ULF_RUN run;
+    T_ULSI_D item;
+    if (!CheckData() || !ReadRun(run, item)) return 0;
+    T_ULF_STAGE_FORMED formed = FormUlfStageProblem(item, run.constraints);
+    m_source.m_loads = formed.loads;
     m_source.m_sumStageLoads = m_sumStageLoads;
+    run.formed = std::move(formed);
     COptDsgn optimizer(m_source, &m_source);
-    const bool found = optimizer.Run(m_formed.problem, m_answer) != 0;
-    GSaveHistoryFormatNF(
-        "%s", MMSGFunction::GetValue(found ? "IDS_RPS_Unknown_CAN_FIND_OPTIMIZED_SOLUTION"
-                                           : "IDS_RPS_Unknown_CANNOT_FIND_OPTIMIZED_SOLUTION")
-                  .c_str());
-    if (!found) {
-        constexpr const char* key = "IDS_RPS_Unknown_Load_Factor_Item_has_an_error";
-        ShowMessage(key, MMSGFunction::Format(key, {m_name, FailureText()}));
-        return 0;
-    }
-    m_result = MakeResult(item);
-    return 1;
-}
-
-/// The optimizer's message with the name of the constraint or row that it numbers.
-std::string CUnknownStageItemDlg::FailureText() const
-{
-    std::string name;
-    if (m_answer.constraint > 0)
-        name =
-            m_constraints[m_formed.owner[static_cast<std::size_t>(m_answer.constraint - 1)]].name;
-    else if (m_answer.factor > 0)
-        name = CellText(RowOfUnknown(static_cast<std::size_t>(m_answer.factor - 1)), Stage);
-    return name.empty() ? m_answer.message : m_answer.message + " (" + name + ")";
-}
-
-/// The optimizer's rows of responses, by grid row: what had no part in the problem is left out.
-T_ULF_RESULT CUnknownStageItemDlg::MakeResult(const T_ULSI_D& item) const
-{
-    T_ULF_RESULT r;
-    r.item.name = item.name;
-    r.item.objective = item.objective;
-    r.item.sign = item.sign;
-    r.item.constraints = item.constraints;
-    std::size_t unknown = 0;
-    for (std::size_t i = 0; i < item.rows.size(); ++i) {
-        const T_ULSI_ROW& row = item.rows[i];
-        if (!row.unknown && IsUnknownItem({0.0, row.factor, 1.0, 0.0})) continue;
-        r.cases.push_back({row.loadCase, CellText(i, Stage) + " " + CellText(i, LoadCase),
-                           row.factor, row.unknown, row.weight});
-        r.factors.push_back(row.unknown ? m_answer.factors[unknown++] : row.factor);
-    }
-    for (const T_ULFC_D& c : m_constraints)
-        r.constraints.push_back(UlfResultConstraint(c));
-    r.influence.resize(m_constraints.size());
-    for (std::size_t i = 0; i < m_formed.owner.size(); ++i)
-        r.influence[m_formed.owner[i]] = m_answer.coefficients[i];
-    r.exact = m_answer.exact;
-    r.code = m_answer.code;
-    return r;
+    const bool found = optimizer.Run(run.formed.problem, run.answer) != 0;
+    const bool solved = ReadUlfStageInfluence(item, run.formed, m_source, run.influence) && found;
+    return Finish(std::move(run), solved, m_source.Error());
 }
 
 std::vector<T_ULF_ITER_ROW> CUnknownStageItemDlg::SolvedRows() const
 {
     std::vector<T_ULF_ITER_ROW> rows;
-    for (std::size_t i = 0; m_result && i < m_formed.unknowns.size(); ++i) {
+    for (std::size_t i = 0; Result() && i < LastRun()->formed.unknowns.size(); ++i) {
         const std::size_t row = RowOfUnknown(i);
-        rows.push_back({CellText(row, Stage), m_answer.factors[i], m_rows[row].pretension});
+        rows.push_back({CellText(row, Stage), LastRun()->answer.factors[i], m_rows[row].pretension,
+                        CellText(row, LoadCase)});
     }
     return rows;
 }

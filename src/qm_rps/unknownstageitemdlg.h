@@ -2,14 +2,11 @@
 // and step, objective, sign and constraints, and the calculation of its factors.
 #pragma once
 
-#include "qm_db/dbdoc.h"
-#include "qm_rps/hingedialog.h"
+#include "qm_rps/ulfitemdialog.h"
 #include "qm_rps/ulfiteration.h"
-#include "qm_rps/ulfresult.h"
 #include "qm_rps/ulfstageproblem.h"
-#include "qm_rps/ulfstageresponse.h"
 
-class CUnknownStageItemDlg : public CHingeDialog {
+class CUnknownStageItemDlg : public CUlfItemDialog {
 public:
     /// Columns of the grid; flags are "1" and "0".
     enum COLUMN { Stage, LoadCase, Unknown, Known, Factor, Weight, Pretension, Group };
@@ -20,12 +17,11 @@ public:
     /// Texts of the load groups, and of the sum of the stage loads.
     static constexpr std::array<const char*, 3> kGroupKeys{"IDS_RPS_DL", "IDS_RPS_ER",
                                                            "IDS_QM_ULSI_OWN"};
-    static constexpr const char* kSumKey = "IDS_RPS_SUM";
-
-    struct T_CHECK {
-        std::string name; // of a constraint of the model
-        bool checked = false;
-        bool operator==(const T_CHECK&) const = default;
+    /// A row below the grid: how many loads read the dead load, the erection load, and in all.
+    struct T_SUMMARY {
+        const char* key = nullptr; // of its text
+        std::size_t rows = 0, unknowns = 0;
+        bool operator==(const T_SUMMARY&) const = default;
     };
 
     /// Document and results must outlive the dialog. key: of the item to edit, 0 for a new one.
@@ -37,13 +33,10 @@ public:
     /// Checks, then writes. 0: a message was shown, `item` as it was.
     [[nodiscard]] int Dlg2Data(T_ULSI_D& item);
 
-    std::string m_name;
-    int m_objective = 0; // index as in CUnknownLoadFactorItemDlg
-    int m_sign = 1;      // likewise
-    bool m_solveByEquations = false;
-    bool m_sumStageLoads = false;   // load groups 0 and 1 read the sum of all stage loads
-    std::vector<T_CHECK> m_checks;  // all constraints of the model
-    std::vector<T_ULSI_ROW> m_rows; // of the grid
+    bool m_sumStageLoads = false; // load groups 0 and 1 read the sum of all stage loads
+    /// Of the grid, in the order in which a person gave them. A stored item has its unknown rows
+    /// before its known ones (FitRecord).
+    std::vector<T_ULSI_ROW> m_rows;
 
     /// Text of a cell: factors as "%.3f", weights as "%.6f", the stage as "S1/First Step".
     std::string CellText(std::size_t row, COLUMN column) const;
@@ -51,36 +44,33 @@ public:
     /// a finite number; the cell as it was.
     [[nodiscard]] int SetCell(std::size_t row, COLUMN column, const std::string& text);
 
+    /// Rows of load group 0, of group 1, and all of them.
+    std::array<T_SUMMARY, 3> Summary() const;
+
+    /// Rules that are not kept; of a row each is told with its number, stage/step and load case.
     std::vector<T_FINDING> Findings() const override;
     /// Checks, then stores the item as one edit that can be undone. 0: refused, nothing stored.
     int OnOK() override;
     int Key() const { return m_key; }
 
-    /// One calculation with the stage results at hand. 1: Result() has the factors; 0: refused or
-    /// not solved, with a message, and no result kept. Either outcome goes to the history.
-    [[nodiscard]] int OnCalculate();
-    const std::optional<T_ULF_RESULT>& Result() const { return m_result; }
-    const T_OPT_ANSWER& Answer() const { return m_answer; }
+    /// With the stage results at hand. The cases of the result are the rows, "S1/First Step T".
+    [[nodiscard]] int OnCalculate() override;
     /// The unknowns with their factors of the latest solution, in the order of the problem.
     std::vector<T_ULF_ITER_ROW> SolvedRows() const;
-    /// Grid row of an unknown of the problem.
-    std::size_t RowOfUnknown(std::size_t unknown) const { return m_formed.unknowns[unknown]; }
+    /// Grid row of an unknown of the problem; a calculation must have reached the optimizer.
+    std::size_t RowOfUnknown(std::size_t unknown) const
+    {
+        return LastRun().value().formed.unknowns[unknown];
+    }
 
     /// The calculation button: checks the input, then runs the iteration on the host. 1 see
     /// CUlfIteration::Run; 0 refused with a message, or as there.
     [[nodiscard]] int OnIterate(CUlfIteration& iteration);
 
 private:
-    int ReadConstraints(const T_ULSI_D& item);
-    T_ULF_RESULT MakeResult(const T_ULSI_D& item) const;
-    std::string FailureText() const;
+    [[nodiscard]] int ReadRun(T_ULF_RUN& run, T_ULSI_D& item);
 
     CDBDoc& m_doc;
     int m_key = 0;
-    std::vector<std::string> m_missing; // constraints that the item names and the model lacks
     CUlfStageResponse m_source;
-    std::vector<T_ULFC_D> m_constraints; // that take part, of the latest calculation
-    T_ULF_STAGE_FORMED m_formed;
-    T_OPT_ANSWER m_answer;
-    std::optional<T_ULF_RESULT> m_result;
 };

@@ -1,6 +1,8 @@
 #include "qm_rps/unknowntabletabgrid1.h"
 
 #include "qm_base/msgfunction.h"
+#include "qm_rps/ulfresult.h"
+#include "qm_rps/ulfstageplace.h"
 #include "qm_rps/ulftexts.h"
 #include "qm_rps/unknownloadfactorconstraintdlg.h"
 
@@ -10,13 +12,17 @@ using zql::lib::MMSGFunction;
 
 namespace {
 
+/// Items of both kinds, static and of construction stages.
 std::string ItemsThatUse(const T_MODEL& model, const std::string& constraint)
 {
     std::string names;
-    for (const auto& [key, item] : model.ulfItems)
-        if (std::find(item.constraints.begin(), item.constraints.end(), constraint) !=
-            item.constraints.end())
-            names += (names.empty() ? "" : ", ") + item.name;
+    const auto collect = [&](const auto& table) {
+        for (const auto& [key, item] : table)
+            if (std::ranges::find(item.constraints, constraint) != item.constraints.end())
+                names += (names.empty() ? "" : ", ") + item.name;
+    };
+    collect(model.ulfItems);
+    collect(model.ulfStageItems);
     return names;
 }
 
@@ -27,7 +33,9 @@ std::vector<CUnknownTableTabGrid1::T_ROW> CUnknownTableTabGrid1::Rows() const
     std::vector<T_ROW> rows;
     for (const int key : m_doc.Attr().GetUlfcKeys()) {
         T_ULFC_D c;
-        if (m_doc.Attr().GetUlfc(key, c)) rows.push_back({key, c.name, UlfDescription(c)});
+        if (!m_doc.Attr().GetUlfc(key, c)) continue;
+        const std::string place = UlfPlaceText(m_doc.Data(), c.stage, c.step);
+        rows.push_back({key, c.name, UlfNameAt(UlfDescription(c), place)});
     }
     return rows;
 }

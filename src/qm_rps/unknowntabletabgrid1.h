@@ -9,7 +9,8 @@ public:
     struct T_ROW {
         int key = 0;
         std::string name;
-        std::string description; // quantity, relation and bound, in the document's current units
+        /// Quantity, relation and bound in the document's current units; stage and step, if any.
+        std::string description;
         bool operator==(const T_ROW&) const = default;
     };
 

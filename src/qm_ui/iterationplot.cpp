@@ -6,14 +6,19 @@
 
 namespace {
 
+std::string NameOf(const T_ULF_ITER_ROW& row)
+{
+    return row.place + (row.load.empty() ? "" : " " + row.load);
+}
+
 constexpr std::size_t kNamed = 8; // factors with a line in the legend
 
 T_PLOT_SERIES FactorSeries(const std::vector<T_ULF_ITER_STEP>& history, std::size_t row)
 {
     T_PLOT_SERIES s;
     if (row < kNamed)
-        s.name =
-            FormatText("Factor %d, ", static_cast<int>(row) + 1) + history.front().rows[row].place;
+        s.name = FormatText("Factor %d, ", static_cast<int>(row) + 1) +
+                 NameOf(history.front().rows[row]);
     for (const T_ULF_ITER_STEP& step : history) {
         s.x.push_back(step.iteration);
         s.y.push_back(step.rows[row].factor);
@@ -51,9 +56,11 @@ T_PLOT IterationPlot(const std::string& item, const T_ULF_ITER_SETTINGS& setting
     T_PLOT plot;
     if (history.empty()) return plot;
     plot.title = "Iterative analysis for pretension: " + item;
-    plot.subtitle =
-        FormatText("%d of %d iterations, tolerance %.3g at the end", history.back().iteration,
-                   settings.required, history.back().tolerance);
+    const T_ULF_ITER_STEP& end = history.back();
+    const bool converged = end.iteration > 0 && settings.tolerance >= end.tolerance;
+    plot.subtitle = FormatText("%s after %d of at most %d iterations, tolerance %.3g",
+                               converged ? "Converged" : "Not converged", end.iteration,
+                               settings.required, end.tolerance);
     plot.x.title = "Iteration";
     plot.x.range = T_PLOT_RANGE{-0.2, std::max(1, history.back().iteration) + 0.2};
     for (const T_ULF_ITER_STEP& step : history)
@@ -68,7 +75,7 @@ T_PLOT IterationPlot(const std::string& item, const T_ULF_ITER_SETTINGS& setting
     for (std::size_t row = 0; row < last.size(); ++row) {
         plot.series.push_back(FactorSeries(history, row));
         plot.notes.push_back(FormatText("Factor %d, %s = %.6g%s", static_cast<int>(row) + 1,
-                                        last[row].place.c_str(), last[row].factor,
+                                        NameOf(last[row]).c_str(), last[row].factor,
                                         last[row].pretension ? "" : " (no pretension)"));
     }
     if (settings.tolerance > 0.0)

@@ -104,6 +104,52 @@ TEST(StagedSolver, SegmentsBornToDesignDeflectAsIfBuiltAtOnce)
     }
 }
 
+TEST(StagedSolver, AClosedBridgeCarriesAsCantileversWhatItCarriedBefore)
+{
+    // Arms of 6 from two clamps 14 apart, w on them; then the closure, and p on the whole:
+    // clamp w a2 / 2 + p L2 / 12, mid-span p L2 / 24, arms' ends w a4 / 8EI + p x2 (L - x)2 / 24EI.
+    constexpr double a = 6.0, L = 14.0, w = 12.0, p = 5.0;
+    T_STAGED_MODEL model;
+    model.frame = Empty();
+    for (const double x : {0.0, a, L - a, L})
+        AddNode(model.frame, {x, 0, 0});
+    FixAll(model.frame, 0);
+    FixAll(model.frame, 3);
+    for (const std::size_t n : {0, 2, 1}) // the closure last
+        Join(model.frame, kBeam, n, n + 1);
+    model.groups = {LOAD_GROUP::Dead, LOAD_GROUP::Dead};
+    model.stages.resize(3);
+    model.stages[0].activateElements = {0, 1};
+    model.stages[0].activateSupports = {{0, {}}, {3, {}}};
+    model.stages[0].activateLoads = {{0, kFirstStep}};
+    model.stages[1].activateElements = {2};
+    model.stages[2].activateLoads = {{1, kFirstStep}};
+    std::vector<T_LOAD_CASE> cases(2);
+    const auto load = [](std::size_t e, double value) {
+        T_BEAM_LOAD q;
+        q.element = e;
+        q.w = {-value, -value};
+        return q;
+    };
+    for (const std::size_t e : {0, 1, 2}) {
+        if (e < 2) cases[0].beam.push_back(load(e, w));
+        cases[1].beam.push_back(load(e, p));
+    }
+    CStagedSolver staged;
+    Build(staged, model, cases);
+    T_RESULT r;
+    for (const std::size_t stage : {1, 2}) {
+        const double later = stage == 2 ? p : 0.0;
+        ASSERT_TRUE(staged.ReadSum(stage, kLastStep, STAGE_SUM::All, r));
+        EXPECT_NEAR(w * a * a / 2 + later * L * L / 12, r.force[0][0][4], 1e-9);
+        EXPECT_NEAR(-later * L * L / 24, r.force[2][2][4], 1e-9);
+        for (const std::size_t n : {1, 2})
+            EXPECT_NEAR(-w * std::pow(a, 4) / (8 * kEI) -
+                            later * a * a * (L - a) * (L - a) / (24 * kEI),
+                        r.displacement[n][2], 1e-12);
+    }
+}
+
 TEST(StagedSolver, AgesCountFromTheStageOfBirth)
 {
     T_STAGED_MODEL model = Balanced();

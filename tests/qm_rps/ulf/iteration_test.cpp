@@ -1,9 +1,7 @@
+#include "iterationperson.h"
+#include "qm_db/dbdoc.h"
 #include "qm_db/filectrl.h"
-#include "qm_rps/ulfiterationdochost.h"
-#include "qm_rps/ulfiterationresultdlg.h"
-#include "qm_rps/ulfstageresults.h"
 #include "qm_rps/unknownloadfactoriteranaldlg.h"
-#include "twotrusses.h"
 
 #include <filesystem>
 #include <gtest/gtest.h>
@@ -42,6 +40,13 @@ public:
     }
     int CloseEdit() override { return Do("close"); }
     void CancelEdit() override { (void)Do("cancel"); }
+    void UndoEdit() override { (void)Do("undo"); }
+    void CancelAnalysis() override
+    {
+        m_left = 0;
+        m_fail = "post";
+        (void)Do("stop");
+    }
     int StartAnalysis() override
     {
         m_left = m_busy;
@@ -63,32 +68,6 @@ private:
     }
     std::size_t m_solved = 0;
     int m_left = 0;
-};
-
-/// Accepts result dialogs as often as wanted and answers the question about the report.
-class CPerson : public zql::frx::IDialogView {
-public:
-    int m_accept = 99; // dialogs in which iteration is chosen
-    bool m_overwrite = false;
-    LINES m_asked;
-    int m_events = 0;
-    void ShowMessage(const std::string& key, const std::string&) override
-    {
-        m_asked.push_back(key);
-    }
-    bool AskYesNo(const std::string&, const std::string& text) override
-    {
-        m_asked.push_back(text);
-        return m_overwrite;
-    }
-    int RunModal(zql::frx::MDialog& child) override
-    {
-        auto* dialog = dynamic_cast<CUlfIterationResultDlg*>(&child);
-        if (!dialog) return 0;
-        dialog->m_iterate = m_accept-- > 0;
-        return 1;
-    }
-    void DispatchEvents() override { ++m_events; }
 };
 
 class UlfIteration : public testing::Test {
@@ -247,8 +226,8 @@ TEST_F(UlfIteration, StopsWhereTheHostRefuses)
         {"scale 0", ULF_ITER_END::NotScaled, "cancel", 1},
         {"scale 1", ULF_ITER_END::NotScaled, "cancel", 1},
         {"close", ULF_ITER_END::NotScaled, "cancel", 1},
-        {"analyse", ULF_ITER_END::NotAnalysed, "analyse", 1},
-        {"post", ULF_ITER_END::NotAnalysed, "post", 1},
+        {"analyse", ULF_ITER_END::NotAnalysed, "save frame_01.ext", 1},
+        {"post", ULF_ITER_END::NotAnalysed, "save frame_01.ext", 1},
         {"solve1", ULF_ITER_END::NotSolved, "solve1", 1},
     };
     const CScriptedHost fresh;
@@ -264,6 +243,8 @@ TEST_F(UlfIteration, StopsWhereTheHostRefuses)
         EXPECT_EQ(c.end, run.End()) << c.fail;
         EXPECT_EQ(c.last, host.m_log.back()) << c.fail;
         EXPECT_EQ(c.blocks, Blocks()) << c.fail;
+        const bool undone = std::count(host.m_log.begin(), host.m_log.end(), "undo") > 0;
+        EXPECT_EQ(c.end == ULF_ITER_END::NotAnalysed, undone) << c.fail;
     }
 }
 
@@ -314,61 +295,23 @@ TEST_F(UlfIteration, CancelsBetweenIterationsWithEverythingReported)
     EXPECT_EQ(3U, Blocks());
 }
 
-TEST_F(UlfIteration, BringsATwoTrussFrameToItsTensionInOneIteration)
+TEST_F(UlfIteration, CancelDuringAnAnalysisTakesTheLoadsBack)
 {
-    CDBDoc doc;
-    doc.Data().Assign(two::Content());
-    T_FILE_ERROR error;
-    ASSERT_EQ(1, doc.SaveAs(m_folder + "/frame.qmdb", error)) << error.text;
-    T_ANALYSIS_OPTIONS options;
-    options.allCases = false;
-    T_ANALYSIS_ERROR fault;
-    ASSERT_EQ(1, doc.RunAnalysis(options, fault)) << fault.text;
-    CUlfStageResults results(doc);
-    CUnknownStageItemDlg dialog(doc, results, 1);
-    CUlfIterationDocHost host(doc, dialog, &m_person);
-    CUlfIteration run(host, {});
-    dialog.SetView(&m_person);
-    ASSERT_EQ(1, dialog.OnIterate(run)) << host.Error();
-    EXPECT_EQ(ULF_ITER_END::Converged, run.End());
-    ASSERT_EQ(2U, run.History().size());
-    EXPECT_EQ("S1/First Step", run.History()[0].rows.at(0).place);
-    EXPECT_NEAR(4.0, run.History()[0].rows.at(0).factor, 1e-12); // T = 4 holds G
-    EXPECT_NEAR(1.0, run.History()[1].rows.at(0).factor, 1e-12);
-    EXPECT_GT(m_person.m_events, 0);
-    T_DOF6 u{};
-    doc.Post().SelectStage(1, kStageFirstStep, kStageLoadSum);
-    ASSERT_EQ(1, doc.Post().GetDspcNew(2, u));
-    EXPECT_NEAR(0.0, u[0], 1e-12);
-    // The copy on disk has the new tension, the model itself the old one.
-    for (const auto& [name, force] :
-         {std::pair{"/frame.qmdb", 1.0}, std::pair{"/frame_01.qmdb", 4.0}}) {
-        CDBDoc other;
-        ASSERT_EQ(1, other.OpenModel(m_folder + name, OPEN_MODE::ReadOnly, error)) << error.text;
-        EXPECT_NEAR(force, other.Data().Model().loadCases.at(2).pretension.at(0).force, 1e-12);
-    }
-    // One command of the person takes the change back.
-    EXPECT_EQ("Change load values for iterative analysis", doc.Undo().UndoTitle());
-    ASSERT_EQ(1, doc.Undo().Undo());
-    EXPECT_EQ(1.0, doc.Data().Model().loadCases.at(2).pretension.at(0).force);
-}
-
-TEST_F(UlfIteration, LeavesTheLoadsWhenOneOfThemCannotBeChanged)
-{
-    T_MODEL_CONTENT content = two::Content();
-    content.model.loadCases[2].pretension.push_back({9, 1.0}); // there is no such element
-    CDBDoc doc;
-    doc.Data().Assign(std::move(content));
-    CUlfStageResults results(doc);
-    CUnknownStageItemDlg dialog(doc, results, 1);
-    CUlfIterationDocHost host(doc, dialog, nullptr);
-    (void)dialog.OnCalculate(); // forms the problem; without results there are no factors
-    ASSERT_EQ(1, host.StartEdit("scale"));
-    EXPECT_EQ(0, host.ScalePretension(0, 2.0));
-    EXPECT_NE(std::string::npos, host.Error().find('9'));
-    host.CancelEdit();
-    EXPECT_EQ(1.0, doc.Data().Model().loadCases.at(2).pretension.at(0).force);
-    EXPECT_FALSE(doc.Undo().CanUndo());
+    m_host.m_factors = {{2, 1}};
+    m_host.m_busy = 3;
+    std::vector<int> told;
+    m_progress = [&](int done, int) {
+        told.push_back(done);
+        return told.size() != 7; // in the second analysis, after its second look at the events
+    };
+    EXPECT_EQ(0, Run());
+    EXPECT_EQ(ULF_ITER_END::Cancelled, m_end);
+    EXPECT_EQ((std::vector<int>{0, 0, 0, 0, 1, 1, 1}), told);
+    const LINES end{"analyse", "dispatch", "dispatch", "stop", "post", "undo", "save frame_02.ext"};
+    ASSERT_GT(m_host.m_log.size(), end.size());
+    EXPECT_EQ(end, LINES(m_host.m_log.end() - static_cast<int>(end.size()), m_host.m_log.end()));
+    EXPECT_EQ(2U, m_history.size());
+    EXPECT_EQ(2U, Blocks());
 }
 
 TEST(UlfIterationSettings, StayWithTheDocumentUnderTheirKey)

@@ -1,0 +1,62 @@
+// What the dialogs of unknown load factor items have in common, static ones and those of
+// construction stages: name, objective, sign, constraints, and what a calculation leaves.
+#pragma once
+
+#include "qm_db/dbdoc.h"
+#include "qm_rps/hingedialog.h"
+#include "qm_rps/ulfresult.h"
+
+class CUlfItemDialog : public CHingeDialog {
+public:
+    /// Texts of the choices, by index.
+    static constexpr std::array<const char*, 3> kObjectiveKeys{
+        "IDS_QM_ULF_LINEAR", "IDS_QM_ULF_SQUARE", "IDS_QM_ULF_MIN_MAX"};
+    static constexpr std::array<const char*, 3> kSignKeys{"IDS_QM_ULF_NEGATIVE", "IDS_QM_ULF_FREE",
+                                                          "IDS_QM_ULF_POSITIVE"};
+
+    struct T_CHECK {
+        std::string name; // of a constraint of the model
+        bool checked = false;
+        bool operator==(const T_CHECK&) const = default;
+    };
+
+    std::string m_name;
+    int m_objective = 0; // index of kObjectiveKeys
+    int m_sign = 1;      // index of kSignKeys
+    bool m_solveByEquations = false;
+    std::vector<T_CHECK> m_checks; // all constraints of the model
+
+    /// The calculation. 1: Result() has the factors; constraints that equations could not meet to
+    /// 1e-6 are named in a message. 0: refused or not solved, with a message, and no result kept.
+    /// Either outcome goes to the message history.
+    [[nodiscard]] virtual int OnCalculate() = 0;
+    const std::optional<T_ULF_RESULT>& Result() const { return m_result; }
+    /// Of the latest calculation that reached the optimizer, for its explanation.
+    const std::optional<T_ULF_RUN>& LastRun() const { return m_run; }
+
+protected:
+    /// Flags of the grids: "1" and "0".
+    static std::string Flag(bool on) { return on ? "1" : "0"; }
+
+    /// The constraints of the model in its order, or those of the item before the others, with
+    /// these names checked.
+    void SetChecks(const T_MODEL& model, const std::vector<std::string>& names, bool itemsFirst);
+    /// Names that are checked, then those that the model lacks.
+    std::vector<std::string> CheckedNames() const;
+    /// The constraints of run.item. 1 done; 0 one of them is gone.
+    [[nodiscard]] static int ReadConstraints(CDBDoc& doc, T_ULF_RUN& run);
+
+    /// Forgets the latest calculation.
+    void Forget();
+    /// Keeps the run; makes the result, or shows why there is none: the optimizer's message with
+    /// the name of what it numbers, or why a response can't be had. `solved` comes back.
+    int Finish(T_ULF_RUN run, bool solved, const std::string& sourceError);
+
+private:
+    static std::string FailureText(const T_ULF_RUN& run, const std::string& sourceError);
+    void ReportMisses();
+
+    std::vector<std::string> m_missing; // constraints that the item names and the model lacks
+    std::optional<T_ULF_RUN> m_run;
+    std::optional<T_ULF_RESULT> m_result;
+};
