@@ -22,6 +22,8 @@ public:
     /// 1 shown; 0 there is no such source.
     int Show(const T_SHAPE_SOURCE& source, int step);
     void SetStep(int step);
+    /// Looks at the frame as suits it: a plane one straight on, any other isometrically.
+    void ResetCamera();
     CFrameView& View() { return *m_view; }
     QSlider& Slider() { return *m_slider; }
     const std::vector<T_SHAPE_SOURCE>& Sources() const { return m_sources; }

@@ -1,4 +1,5 @@
 #include "mainwindow.h"
+#include "windowpictures.h"
 
 #include <QApplication>
 #include <QCommandLineParser>
@@ -19,7 +20,14 @@ int main(int argc, char** argv)
     parser.addVersionOption();
     parser.addPositionalArgument("model", "Model file (.qmdb) or case file (.json) to open.",
                                  "[model]");
+    const QCommandLineOption pictures(
+        "pictures", "Write pictures of every window into a folder and end.", "folder");
+    const QCommandLineOption examples("examples", "Folder of the example models for --pictures.",
+                                      "folder", "examples");
+    parser.addOptions({pictures, examples});
     parser.process(app);
+    if (parser.isSet(pictures))
+        return WriteWindowPictures(parser.value(pictures), parser.value(examples)) ? 1 : 0;
     CMainWindow window;
     window.show();
     if (!parser.positionalArguments().isEmpty())

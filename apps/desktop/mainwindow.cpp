@@ -287,6 +287,7 @@ int CMainWindow::Open(const QString& path)
     const int done = m_frame.OnOpen(path.toStdString());
     if (done) AddRecent(QFileInfo(path).absoluteFilePath());
     Refresh();
+    if (done) m_framePane->ResetCamera();
     return done;
 }
 

@@ -1,10 +1,29 @@
 #include "toolcommands.h"
 
-void RegisterViews(CViewFactory&) {}
+#include "hingetools.h"
+#include "loadcasetools.h"
+#include "pushovertools.h"
+#include "ulftools.h"
 
-T_COMMANDS ToolCommands(T_DESKTOP&)
+void RegisterViews(CViewFactory& factory)
 {
-    return {};
+    RegisterPushoverViews(factory);
+    RegisterLoadCaseViews(factory);
+    RegisterHingeViews(factory);
+    RegisterUlfViews(factory);
 }
 
-void OpenRecord(T_DESKTOP&, EXPLORER_TABLE, int) {}
+T_COMMANDS ToolCommands(T_DESKTOP& desktop)
+{
+    T_COMMANDS all;
+    for (const T_COMMANDS& part : {PushoverCommands(desktop), LoadCaseCommands(desktop),
+                                   HingeCommands(desktop), UlfCommands(desktop)})
+        all.insert(all.end(), part.begin(), part.end());
+    return all;
+}
+
+void OpenRecord(T_DESKTOP& desktop, EXPLORER_TABLE table, int key)
+{
+    for (const auto open : {OpenPushoverRecord, OpenLoadCaseRecord, OpenHingeRecord, OpenUlfRecord})
+        if (open(desktop, table, key)) return;
+}

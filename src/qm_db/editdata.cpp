@@ -11,6 +11,7 @@ int CEditData::Begin(std::string title)
     if (m_open || m_data.IsLocked()) return 0;
     m_step = {std::move(title), {}};
     m_open = true;
+    m_wasModified = m_data.IsModified();
     return 1;
 }
 
@@ -26,9 +27,11 @@ void CEditData::Rollback()
 {
     if (!m_open) return;
     m_open = false;
+    if (m_step.changes.empty()) return;
     T_MODEL& model = m_data.ModelForEdit();
     for (const T_CHANGE_ANY& change : m_step.changes | std::views::reverse)
         CUndoCtrl::Apply(model, change, false);
+    m_data.SetModified(m_wasModified);
     m_step = {};
 }
 

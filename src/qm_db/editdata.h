@@ -83,4 +83,5 @@ private:
     CUndoCtrl& m_undo;
     T_UNDO_STEP m_step;
     bool m_open = false;
+    bool m_wasModified = false; // when the step began
 };

@@ -28,6 +28,18 @@ double SizeOf(const T_FRAME_SCENE& scene)
                                : Length({high[0] - low[0], high[1] - low[1], high[2] - low[2]});
 }
 
+/// Takes off what holds every node, as it does in a plane model: that is no support.
+void KeepSupports(std::vector<T_SCENE_NODE>& nodes)
+{
+    T_DIRS6 all{true, true, true, true, true, true};
+    for (const T_SCENE_NODE& node : nodes)
+        for (std::size_t d = 0; d < all.size(); ++d)
+            all[d] = all[d] && node.held[d];
+    for (T_SCENE_NODE& node : nodes)
+        for (std::size_t d = 0; d < all.size(); ++d)
+            node.held[d] = node.held[d] && !all[d];
+}
+
 /// Ends of elements with generated hinges, by element.
 std::map<int, T_ENDS<bool>> HingedEnds(const T_MODEL& model)
 {
@@ -62,6 +74,7 @@ void CFrameScene::Build()
         at[entry.first] = m_scene.nodes.size();
         m_scene.nodes.push_back(node);
     }
+    KeepSupports(m_scene.nodes);
     const auto hinged = HingedEnds(model);
     for (const auto& [id, e] : model.elements) {
         if (e.kind == ELEM_KIND::Spring || !at.contains(e.nodeI) || !at.contains(e.nodeJ)) continue;
@@ -111,6 +124,18 @@ int CFrameScene::ReadNodes(F read, T_MOVES& out)
     }
     out = std::move(moves);
     return 1;
+}
+
+int CFrameScene::FlatAxis(const T_FRAME_SCENE& scene)
+{
+    for (const int d : {1, 0, 2}) { // frames usually stand in XZ
+        const auto axis = static_cast<std::size_t>(d);
+        const auto same = [&](const T_SCENE_NODE& node) {
+            return node.xyz[axis] == scene.nodes.front().xyz[axis];
+        };
+        if (scene.nodes.size() > 1 && std::ranges::all_of(scene.nodes, same)) return d;
+    }
+    return -1;
 }
 
 int CFrameScene::ReadPushover(int key, int step, T_MOVES& out)

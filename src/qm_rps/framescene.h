@@ -6,7 +6,7 @@
 struct T_SCENE_NODE {
     int id = 0;
     std::array<double, 3> xyz{};
-    T_DIRS6 held{}; // directions of the support
+    T_DIRS6 held{}; // directions of the support; what holds every node is none
 };
 
 struct T_SCENE_LINE {
@@ -55,6 +55,8 @@ public:
                            std::vector<std::array<double, 3>>& out);
     /// Drifts of a step of a pushover load case; empty where there are none.
     std::vector<T_SCENE_DRIFT> Drifts(const T_SHAPE_SOURCE& source, int step);
+    /// The axis normal to a frame that lies in a plane of axes: 0 X, 1 Y, 2 Z; -1: none.
+    static int FlatAxis(const T_FRAME_SCENE& scene);
     /// A factor on the displacements, a round number, that makes the largest a twentieth of the
     /// frame's size.
     static double RoundScale(const T_FRAME_SCENE& scene,

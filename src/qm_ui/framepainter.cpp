@@ -111,6 +111,17 @@ void CFramePainter::DrawLines(QPainter& painter, const T_FRAME_SCENE& scene,
     }
 }
 
+/// Of a model without elements, whose results came from another solver.
+void CFramePainter::DrawNodes(QPainter& painter) const
+{
+    constexpr double kRadius = 3.0;
+    painter.setPen(Qt::NoPen);
+    painter.setBrush(FramePen(KIND::Beam, false, true).color());
+    for (const QPointF p : m_moved)
+        painter.drawEllipse(p, kRadius, kRadius);
+    painter.setBrush(Qt::NoBrush);
+}
+
 /// A triangle under a node that is held from moving, a square where it can't turn either.
 void CFramePainter::DrawSupports(QPainter& painter, const T_FRAME_SCENE& scene) const
 {
@@ -185,6 +196,7 @@ void CFramePainter::Draw(QPainter& painter, const QRectF& rect, const T_FRAME_PI
     if (moved && options.undeformed) DrawLines(painter, scene, m_design, true);
     DrawLines(painter, scene, m_moved, false);
     painter.setRenderHint(QPainter::Antialiasing, true);
+    if (scene.lines.empty()) DrawNodes(painter);
     if (options.supports) DrawSupports(painter, scene);
     if (options.hinges) DrawHinges(painter, scene);
     if (options.nodeNumbers || options.elementNumbers) DrawNumbers(painter, area, picture, options);

@@ -56,6 +56,7 @@ private:
     void Place(const T_FRAME_PICTURE& picture, const T_CAMERA& camera, const QRectF& area);
     void DrawLines(QPainter& painter, const T_FRAME_SCENE& scene, const std::vector<QPointF>& at,
                    bool faint);
+    void DrawNodes(QPainter& painter) const;
     void DrawSupports(QPainter& painter, const T_FRAME_SCENE& scene) const;
     void DrawHinges(QPainter& painter, const T_FRAME_SCENE& scene) const;
     void DrawNumbers(QPainter& painter, const QRectF& area, const T_FRAME_PICTURE& picture,

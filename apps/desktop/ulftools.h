@@ -1,0 +1,15 @@
+// The desktop's tools of load factors.
+#pragma once
+
+#include "command.h"
+#include "desktop.h"
+#include "windowpictures.h"
+
+#include "qm_rps/recordgrid.h"
+
+void RegisterUlfViews(CViewFactory& factory);
+/// Commands in the order of the menus. The desktop must outlive them.
+T_COMMANDS UlfCommands(T_DESKTOP& desktop);
+/// Opens the window of a record. False: the table is not one of these tools.
+bool OpenUlfRecord(T_DESKTOP& desktop, EXPLORER_TABLE table, int key);
+std::vector<T_WINDOW_EXAMPLE> UlfWindowExamples();

@@ -1,0 +1,175 @@
+#include "desktoptest.h"
+
+#include "qm_base/msgfunction.h"
+
+#include <QAction>
+#include <QApplication>
+#include <QComboBox>
+#include <QDialog>
+#include <QDir>
+#include <QKeyEvent>
+#include <QLineEdit>
+#include <QLocale>
+#include <QMessageBox>
+#include <QPushButton>
+#include <QMouseEvent>
+#include <QSettings>
+#include <QTimer>
+
+#include <clocale>
+
+namespace desktop_test {
+
+QString Example(const char* name)
+{
+    return QStringLiteral(QM_PROJECT "/examples/%1/case.json").arg(name);
+}
+
+void Settle()
+{
+    for (int i = 0; i < 5; ++i)
+        QApplication::processEvents();
+}
+
+void Key(QWidget* widget, int key, const QString& text, Qt::KeyboardModifiers with)
+{
+    QKeyEvent press(QEvent::KeyPress, key, with, text), release(QEvent::KeyRelease, key, with);
+    QApplication::sendEvent(widget, &press);
+    QApplication::sendEvent(widget, &release);
+}
+
+void Type(QWidget* field, const QString& text)
+{
+    auto* edit = qobject_cast<QLineEdit*>(field);
+    ASSERT_NE(nullptr, edit);
+    edit->setFocus();
+    edit->selectAll();
+    if (text.isEmpty())
+        Key(edit, Qt::Key_Delete);
+    else
+        Key(edit, 0, text);
+    Key(edit, Qt::Key_Tab);
+}
+
+void Click(QWidget* widget)
+{
+    const QPointF at = QRectF(widget->rect()).center();
+    const QPointF global = widget->mapToGlobal(at);
+    QMouseEvent press(QEvent::MouseButtonPress, at, global, Qt::LeftButton, Qt::LeftButton,
+                      Qt::NoModifier);
+    QMouseEvent release(QEvent::MouseButtonRelease, at, global, Qt::LeftButton, Qt::NoButton,
+                        Qt::NoModifier);
+    QApplication::sendEvent(widget, &press);
+    QApplication::sendEvent(widget, &release);
+}
+
+void ChooseIndex(QWidget* box, int index)
+{
+    auto* list = qobject_cast<QComboBox*>(box);
+    ASSERT_NE(nullptr, list);
+    for (int i = list->currentIndex(); i != index; i += i < index ? 1 : -1)
+        Key(list, i < index ? Qt::Key_Down : Qt::Key_Up);
+}
+
+CAnswers::CAnswers(std::vector<STEP> steps) : m_steps(std::move(steps)), m_timer(new QTimer(this))
+{
+    connect(m_timer, &QTimer::timeout, this, [this] { Look(); });
+    m_timer->start(1);
+}
+
+CAnswers::~CAnswers()
+{
+    EXPECT_EQ(0U, Left()) << "windows that did not come up";
+}
+
+void CAnswers::Look()
+{
+    QWidget* window = QApplication::activeModalWidget();
+    if (!window || !window->isVisible()) return;
+    if (auto* box = qobject_cast<QMessageBox*>(window)) m_texts << box->text();
+    if (m_next < m_steps.size()) {
+        m_steps[m_next++](*window);
+        return;
+    }
+    ADD_FAILURE() << "unexpected window: " << window->windowTitle().toStdString() << ": "
+                  << (m_texts.isEmpty() ? std::string() : m_texts.back().toStdString());
+    if (auto* dialog = qobject_cast<QDialog*>(window)) dialog->reject();
+}
+
+CAnswers::STEP CAnswers::Press(QMessageBox::StandardButton button)
+{
+    return [button](QWidget& window) {
+        auto* box = qobject_cast<QMessageBox*>(&window);
+        ASSERT_NE(nullptr, box);
+        ASSERT_NE(nullptr, box->button(button));
+        Click(box->button(button));
+    };
+}
+
+CAnswers::STEP CAnswers::Accept()
+{
+    return [](QWidget& window) {
+        if (auto* dialog = qobject_cast<QDialog*>(&window)) dialog->accept();
+    };
+}
+
+CAnswers::STEP CAnswers::Reject()
+{
+    return [](QWidget& window) {
+        if (auto* dialog = qobject_cast<QDialog*>(&window)) dialog->reject();
+    };
+}
+
+CAnswers::STEP CAnswers::Fill(std::function<void(CDialogWindow&)> fill, bool accept)
+{
+    return [fill = std::move(fill), accept](QWidget& window) {
+        auto* dialog = dynamic_cast<CDialogWindow*>(&window);
+        ASSERT_NE(nullptr, dialog);
+        fill(*dialog);
+        if (accept) dialog->accept();
+    };
+}
+
+DesktopTest::DesktopTest()
+{
+    const auto* info = testing::UnitTest::GetInstance()->current_test_info();
+    m_folder = QDir::tempPath() + "/qm_desktop_" + info->test_suite_name() + "_" + info->name();
+    QDir(m_folder).removeRecursively();
+    QDir().mkpath(m_folder);
+    QSettings::setDefaultFormat(QSettings::IniFormat);
+    QSettings::setPath(QSettings::IniFormat, QSettings::UserScope, m_folder + "/settings");
+    QLocale::setDefault(QLocale::c());
+    (void)zql::lib::MMSGFunction::SetLanguage("en");
+    m_main = std::make_unique<CMainWindow>();
+    m_main->show();
+    m_main->activateWindow();
+    Settle();
+}
+
+DesktopTest::~DesktopTest()
+{
+    m_main.reset();
+    QDir(m_folder).removeRecursively();
+}
+
+void DesktopTest::Run(const char* key)
+{
+    QAction* action = m_main->Action(key);
+    ASSERT_NE(nullptr, action) << key;
+    ASSERT_TRUE(action->isEnabled()) << key;
+    action->trigger();
+    Settle();
+}
+
+} // namespace desktop_test
+
+int main(int argc, char** argv)
+{
+    qputenv("QT_QPA_PLATFORM", "offscreen");
+    testing::InitGoogleTest(&argc, argv);
+    QApplication app(argc, argv);
+    std::setlocale(LC_NUMERIC, "C");
+    QCoreApplication::setOrganizationName("qm-rps-tests");
+    QCoreApplication::setApplicationName("qm-rps-desktop");
+    return RUN_ALL_TESTS();
+}

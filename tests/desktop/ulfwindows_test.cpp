@@ -1,0 +1,3 @@
+#include "desktoptest.h"
+
+#include "ulftools.h"
