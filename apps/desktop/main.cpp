@@ -30,7 +30,9 @@ int main(int argc, char** argv)
         return WriteWindowPictures(parser.value(pictures), parser.value(examples)) ? 1 : 0;
     CMainWindow window;
     window.show();
-    if (!parser.positionalArguments().isEmpty())
+    if (parser.positionalArguments().isEmpty())
+        (void)window.OfferRecovery();
+    else
         (void)window.Open(parser.positionalArguments().first());
     return QApplication::exec();
 }

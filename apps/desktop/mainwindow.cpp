@@ -10,13 +10,16 @@
 #include <QAction>
 #include <QApplication>
 #include <QCloseEvent>
+#include <QDir>
 #include <QDockWidget>
 #include <QFileInfo>
 #include <QLabel>
 #include <QMenuBar>
 #include <QPlainTextEdit>
 #include <QSettings>
+#include <QStandardPaths>
 #include <QStatusBar>
+#include <QTimer>
 #include <QToolBar>
 
 #include <map>
@@ -57,6 +60,12 @@ CMainWindow::CMainWindow()
     ShowTexts();
     Refresh();
     resize(1280, 800);
+    m_clock.start();
+    constexpr int kTickMs = 1000;
+    auto* timer = new QTimer(this);
+    connect(timer, &QTimer::timeout, this,
+            [this] { m_frame.OnTick(static_cast<double>(m_clock.elapsed()) / kTickMs); });
+    timer->start(kTickMs);
 }
 
 CMainWindow::~CMainWindow()
@@ -280,6 +289,25 @@ T_COMMANDS CMainWindow::WindowCommands()
     return {{kAnalysis, "IDS_QM_UI_ANALYSE", "F5", [this] { Analyse(); }},
             speak("IDS_QM_UI_ENGLISH", "en"),
             speak("IDS_QM_UI_ITALIAN", "it")};
+}
+
+/// In the person's folder for application data.
+std::string CMainWindow::UntitledPath()
+{
+    const QString folder = QStandardPaths::writableLocation(QStandardPaths::AppDataLocation);
+    if (folder.isEmpty() || !QDir().mkpath(folder)) return {};
+    return (folder + "/untitled.qmdb").toStdString();
+}
+
+int CMainWindow::OfferRecovery()
+{
+    std::vector<std::string> files;
+    for (const QString& path : QSettings().value(kRecentKey).toStringList())
+        files.push_back(path.toStdString());
+    const int done = m_frame.OnStart(files);
+    Refresh();
+    if (done) m_framePane->ResetCamera();
+    return done;
 }
 
 int CMainWindow::Open(const QString& path)

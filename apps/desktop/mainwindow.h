@@ -5,6 +5,7 @@
 #include "desktop.h"
 #include "framepane.h"
 
+#include <QElapsedTimer>
 #include <QMainWindow>
 
 #include <memory>
@@ -20,6 +21,8 @@ public:
     CMainWindow();
     ~CMainWindow() override;
 
+    /// Offers what a session that ended without saving has left, among the recent files.
+    int OfferRecovery();
     /// Opens a file as the menu does. 1 opened.
     int Open(const QString& path);
     /// Everything is read again from the document.
@@ -53,14 +56,16 @@ private:
     void Analyse();
     void ExportPicture();
     QString AskSavePath();
+    static std::string UntitledPath();
 
     CViewFactory m_factory;
     CDBDoc m_doc;
-    CMainFrame m_frame{m_doc};
+    CMainFrame m_frame{m_doc, UntitledPath()};
     CDialogView m_view{m_factory, this};
     T_DESKTOP m_desktop;
     CFrameScene m_scene{m_doc};
 
+    QElapsedTimer m_clock;
     CFramePane* m_framePane = nullptr;
     CExplorerPane* m_explorer = nullptr;
     QPlainTextEdit* m_messages = nullptr;

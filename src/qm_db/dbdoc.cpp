@@ -65,6 +65,24 @@ int CDBDoc::OpenModel(const std::string& path, OPEN_MODE mode, T_FILE_ERROR& err
     return 1;
 }
 
+int CDBDoc::RecoverModel(const std::string& copy, const std::string& path, T_FILE_ERROR& error)
+{
+    T_MODEL_CONTENT content, saved;
+    if (!CModelStore().Open(copy, OPEN_MODE::ReadOnly, content, error)) return 0;
+    T_FILE_ERROR fault;
+    const bool isModel = std::filesystem::exists(path) && CModelStore::IsModelFile(path);
+    if (!isModel || !m_store.Open(path, OPEN_MODE::Edit, saved, fault)) {
+        if (fault.fault == FILE_FAULT::NoAccess) {
+            error = fault;
+            return 0;
+        }
+        m_store.Close();
+    }
+    Reset(std::move(content), path);
+    m_data.SetModified(true);
+    return 1;
+}
+
 int CDBDoc::ImportCase(const std::string& path, T_FILE_ERROR& error)
 {
     T_MODEL_CONTENT content;

@@ -40,6 +40,11 @@ public:
     /// Opens a model file (see CModelStore::Open) or reads a case file. 1 done; 0 error filled
     /// and the document as it was.
     [[nodiscard]] int OpenModel(const std::string& path, OPEN_MODE mode, T_FILE_ERROR& error);
+    /// Takes a model from a copy of its file (CAutosave), unsaved, and the writer's lock of the
+    /// file itself where that can be opened; a damaged or missing one does not matter. 1 done; 0
+    /// error filled: the copy can't be read, or another program has the file open.
+    [[nodiscard]] int RecoverModel(const std::string& copy, const std::string& path,
+                                   T_FILE_ERROR& error);
     [[nodiscard]] int ImportCase(const std::string& path, T_FILE_ERROR& error);
     /// Saves to the file it was opened from, or to another one. 1 done; 0 error filled, the file
     /// on disk as it was.

@@ -25,6 +25,60 @@ void Note(const char* key, const std::string& what)
 
 } // namespace
 
+CMainFrame::CMainFrame(CDBDoc& doc, const std::string& untitled) : m_doc(doc), m_untitled(untitled)
+{
+    FollowDocument();
+}
+
+/// The copies of the document go beside its file.
+void CMainFrame::FollowDocument()
+{
+    m_autosave.Follow(m_readOnly             ? std::string()
+                      : m_doc.Path().empty() ? m_untitled
+                                             : m_doc.Path());
+    m_autosaveFailed = false;
+}
+
+int CMainFrame::OfferRecovery(const std::string& file)
+{
+    T_AUTOSAVE_COPY copy;
+    if (file.empty() || !CAutosave::Newest(file, copy)) return 0;
+    constexpr const char* kKey = "IDS_QM_UI_RECOVER";
+    if (!AskYesNo(kKey, MMSGFunction::Format(kKey, {NameOfFile(file == m_untitled ? "" : file),
+                                                    std::to_string(copy.sequence)})))
+        return 0;
+    T_FILE_ERROR error;
+    if (!m_doc.RecoverModel(copy.path, file == m_untitled ? std::string() : file, error))
+        return Refuse(error.text);
+    m_readOnly = false;
+    FollowDocument();
+    Note("IDS_QM_UI_RECOVERED", copy.path);
+    return 1;
+}
+
+int CMainFrame::OnStart(const std::vector<std::string>& files)
+{
+    for (const std::string& file : files)
+        if (OfferRecovery(file)) return 1;
+    return OfferRecovery(m_untitled);
+}
+
+void CMainFrame::OnTick(double nowS)
+{
+    T_FILE_ERROR error;
+    switch (m_autosave.Tick(nowS, error)) {
+    case AUTOSAVE::Written:
+        m_autosaveFailed = false;
+        break;
+    case AUTOSAVE::Failed:
+        if (!m_autosaveFailed) Note("IDS_QM_UI_AUTOSAVE_FAILED", error.text);
+        m_autosaveFailed = true;
+        break;
+    case AUTOSAVE::Nothing:
+        break;
+    }
+}
+
 int CMainFrame::Refuse(const std::string& text)
 {
     constexpr const char* kKey = "IDS_QM_UI_FILE_REFUSED";
@@ -56,6 +110,7 @@ bool CMainFrame::MayReplace()
         return !path.empty() && OnSaveAs(path) != 0;
     }
     case ANSWER::No:
+        m_autosave.Remove();
         return true;
     default:
         return false;
@@ -67,6 +122,7 @@ int CMainFrame::OnNew()
     if (!MayReplace()) return 0;
     m_doc.NewModel();
     m_readOnly = false;
+    FollowDocument();
     return 1;
 }
 
@@ -98,6 +154,8 @@ int CMainFrame::OnOpen(const std::string& path)
         m_readOnly = false;
     }
     Note("IDS_QM_UI_OPENED", path);
+    FollowDocument();
+    if (!m_readOnly) (void)OfferRecovery(path);
     return 1;
 }
 
@@ -113,6 +171,9 @@ int CMainFrame::OnSaveAs(const std::string& path)
     T_FILE_ERROR error;
     if (!m_doc.SaveAs(to, error)) return Refuse(error.text);
     m_readOnly = false;
+    m_autosave.Remove(); // what they held is in the file now
+    FollowDocument();
+    m_autosave.Remove(); // of a file that was replaced
     Note("IDS_QM_UI_SAVED", to);
     return 1;
 }

@@ -2,12 +2,14 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
+#include "qm_db/autosave.h"
 #include "qm_db/dbdoc.h"
 
 class CMainFrame : public zql::frx::MDialog {
 public:
     /// The document must outlive the frame.
-    explicit CMainFrame(CDBDoc& doc) : m_doc(doc) {}
+    /// untitled: the file that copies of a document without a path go beside; empty: none are made.
+    explicit CMainFrame(CDBDoc& doc, const std::string& untitled = {});
 
     CDBDoc& Doc() { return m_doc; }
     /// "frame.qmdb", with a star while there are unsaved edits and a note where it is read only.
@@ -31,6 +33,13 @@ public:
     /// May the window close? Edits are saved, given up, or the answer is no.
     [[nodiscard]] int OnClose();
 
+    /// Looks at these files, and the one for documents without a path, for copies of a session that
+    /// ended without saving; asks about the first that has one. 1 recovered.
+    [[nodiscard]] int OnStart(const std::vector<std::string>& files);
+    /// To be called every second or so: copies for the case of a crash, see CAutosave::Tick. A copy
+    /// that can't be written is told once.
+    void OnTick(double nowS);
+
     [[nodiscard]] int OnUndo() { return m_doc.Undo().Undo(); }
     [[nodiscard]] int OnRedo() { return m_doc.Undo().Redo(); }
 
@@ -44,7 +53,12 @@ private:
     int Refuse(const std::string& text);
     bool MayReplace();
     int OpenModel(const std::string& path);
+    int OfferRecovery(const std::string& file);
+    void FollowDocument();
 
     CDBDoc& m_doc;
+    std::string m_untitled;
+    CAutosave m_autosave{m_doc};
+    bool m_autosaveFailed = false; // and the person knows
     bool m_readOnly = false;
 };

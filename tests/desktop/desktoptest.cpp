@@ -11,9 +11,10 @@
 #include <QLineEdit>
 #include <QLocale>
 #include <QMessageBox>
-#include <QPushButton>
 #include <QMouseEvent>
+#include <QPushButton>
 #include <QSettings>
+#include <QStandardPaths>
 #include <QTimer>
 
 #include <clocale>
@@ -138,6 +139,7 @@ DesktopTest::DesktopTest()
     QDir().mkpath(m_folder);
     QSettings::setDefaultFormat(QSettings::IniFormat);
     QSettings::setPath(QSettings::IniFormat, QSettings::UserScope, m_folder + "/settings");
+    QStandardPaths::setTestModeEnabled(true);
     QLocale::setDefault(QLocale::c());
     (void)zql::lib::MMSGFunction::SetLanguage("en");
     m_main = std::make_unique<CMainWindow>();

@@ -1,0 +1,176 @@
+#include "qm_db/autosave.h"
+#include "qm_db/dbdoc.h"
+
+#include <filesystem>
+#include <fstream>
+#include <gtest/gtest.h>
+
+namespace fs = std::filesystem;
+
+namespace {
+
+/// A document with one node, saved; copies beside it by a clock of the test's own.
+class Autosave : public testing::Test {
+protected:
+    Autosave()
+    {
+        fs::remove_all(m_folder);
+        fs::create_directory(m_folder);
+        m_doc = std::make_unique<CDBDoc>();
+        Move(1.0);
+        T_FILE_ERROR error;
+        EXPECT_EQ(1, m_doc->SaveAs(m_file, error)) << error.text;
+        m_autosave = std::make_unique<CAutosave>(*m_doc);
+        m_autosave->Follow(m_file);
+    }
+    ~Autosave() override { fs::remove_all(m_folder); }
+
+    void Move(double x)
+    {
+        T_NODE_D node;
+        node.id = 1;
+        node.xyz[0] = x;
+        ASSERT_EQ(1, m_doc->Edit().Begin("move"));
+        ASSERT_EQ(1, m_doc->Edit().Put(1, node));
+        ASSERT_EQ(1, m_doc->Edit().Commit());
+    }
+    AUTOSAVE Tick(double nowS)
+    {
+        T_FILE_ERROR error;
+        return m_autosave->Tick(nowS, error);
+    }
+    /// Ticks until a copy of this place of the node is written.
+    void Keep(double x)
+    {
+        Move(x);
+        (void)Tick(m_nowS);
+        m_nowS += 100.0;
+        ASSERT_EQ(AUTOSAVE::Written, Tick(m_nowS));
+    }
+    /// The process ends: nothing is saved or removed, locks go.
+    void Crash()
+    {
+        m_autosave.reset();
+        m_doc.reset();
+        m_doc = std::make_unique<CDBDoc>();
+    }
+    std::vector<long> Sequences() const
+    {
+        std::vector<long> out;
+        for (const auto& copy : CAutosave::Find(m_file))
+            out.push_back(copy.sequence);
+        return out;
+    }
+    double Recovered()
+    {
+        T_AUTOSAVE_COPY copy;
+        T_FILE_ERROR error;
+        if (!CAutosave::Newest(m_file, copy) || !m_doc->RecoverModel(copy.path, m_file, error))
+            return -1.0;
+        return m_doc->Data().Model().nodes.at(1).xyz[0];
+    }
+    void Damage(long sequence) const
+    {
+        std::fstream file(m_file + ".auto-" + std::to_string(sequence),
+                          std::ios::in | std::ios::out | std::ios::binary);
+        file.seekp(5000);
+        file.put('\x5a');
+    }
+
+    std::string m_folder = testing::TempDir() + "qm_autosave_" +
+                           testing::UnitTest::GetInstance()->current_test_info()->name();
+    std::string m_file = m_folder + "/frame.qmdb";
+    std::unique_ptr<CDBDoc> m_doc;
+    std::unique_ptr<CAutosave> m_autosave;
+    double m_nowS = 0.0;
+};
+
+} // namespace
+
+TEST_F(Autosave, WritesAtMostEveryTwentySecondsAndOnlyWhatChanged)
+{
+    EXPECT_EQ(AUTOSAVE::Nothing, Tick(0.0));
+    EXPECT_EQ(AUTOSAVE::Nothing, Tick(1000.0)); // nothing has changed
+    Move(2.0);
+    EXPECT_EQ(AUTOSAVE::Written, Tick(1001.0));
+    Move(3.0);
+    EXPECT_EQ(AUTOSAVE::Nothing, Tick(1020.0));
+    EXPECT_EQ(AUTOSAVE::Written, Tick(1022.0));
+    EXPECT_EQ(AUTOSAVE::Nothing, Tick(2000.0));
+    ASSERT_EQ(1, m_doc->Edit().Begin("half"));
+    Move(4.0); // refused by the open step
+    EXPECT_EQ(AUTOSAVE::Nothing, Tick(3000.0));
+    m_doc->Edit().Rollback();
+}
+
+TEST_F(Autosave, KeepsThreeAndNumbersGoOn)
+{
+    for (const double x : {2.0, 3.0, 4.0, 5.0, 6.0})
+        Keep(x);
+    EXPECT_TRUE(CAutosave::Find(m_file).empty()) << "in use, not left by a crash";
+    Crash();
+    EXPECT_EQ((std::vector<long>{5, 4, 3}), Sequences());
+    EXPECT_EQ(6.0, Recovered());
+    EXPECT_TRUE(m_doc->Data().IsModified());
+    EXPECT_EQ(m_file, m_doc->Path());
+}
+
+TEST_F(Autosave, TheCopyIsChosenByNumberAndChecksumNotByDate)
+{
+    for (const double x : {2.0, 3.0, 4.0})
+        Keep(x);
+    Crash();
+    fs::last_write_time(m_file + ".auto-1", fs::file_time_type::clock::now());
+    fs::last_write_time(m_file + ".auto-3", fs::file_time_type());
+    EXPECT_EQ(4.0, Recovered());
+    Damage(3);
+    EXPECT_EQ(3.0, Recovered());
+    fs::resize_file(m_file + ".auto-2", 0);
+    EXPECT_EQ(2.0, Recovered());
+    Damage(1);
+    EXPECT_EQ(-1.0, Recovered());
+}
+
+TEST_F(Autosave, ASecondCrashDuringRecoveryLosesNothing)
+{
+    for (const double x : {2.0, 3.0, 4.0})
+        Keep(x);
+    Crash();
+    EXPECT_EQ(4.0, Recovered());
+    Crash(); // before anything was written
+    EXPECT_EQ((std::vector<long>{3, 2, 1}), Sequences());
+    EXPECT_EQ(4.0, Recovered());
+    m_autosave = std::make_unique<CAutosave>(*m_doc);
+    m_autosave->Follow(m_file);
+    Keep(7.0);
+    Crash(); // after a copy of the recovered document
+    EXPECT_EQ((std::vector<long>{4, 3, 2}), Sequences());
+    EXPECT_EQ(7.0, Recovered());
+}
+
+TEST_F(Autosave, ADamagedOrMissingFileCanStillBeRecovered)
+{
+    Keep(2.0);
+    Crash();
+    fs::resize_file(m_file, 100);
+    EXPECT_EQ(2.0, Recovered());
+    T_FILE_ERROR error;
+    EXPECT_EQ(1, m_doc->SaveModel(error)) << error.text;
+    fs::remove(m_file);
+    EXPECT_EQ(2.0, Recovered());
+}
+
+TEST_F(Autosave, AFailedCopyLeavesTheOthersAndIsTriedAgain)
+{
+    Keep(2.0);
+    fs::create_directory(m_file + ".auto-2"); // in the way
+    Move(3.0);
+    m_nowS += 100.0;
+    EXPECT_EQ(AUTOSAVE::Failed, Tick(m_nowS));
+    EXPECT_EQ(AUTOSAVE::Nothing, Tick(m_nowS + 1.0));
+    fs::remove(m_file + ".auto-2");
+    EXPECT_EQ(AUTOSAVE::Written, Tick(m_nowS + 100.0));
+    m_autosave->Remove();
+    Crash();
+    EXPECT_TRUE(Sequences().empty());
+}
