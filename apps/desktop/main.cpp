@@ -3,6 +3,7 @@
 
 #include <QApplication>
 #include <QCommandLineParser>
+#include <QTimer>
 
 #include <clocale>
 
@@ -24,7 +25,8 @@ int main(int argc, char** argv)
         "pictures", "Write pictures of every window into a folder and end.", "folder");
     const QCommandLineOption examples("examples", "Folder of the example models for --pictures.",
                                       "folder", "examples");
-    parser.addOptions({pictures, examples});
+    const QCommandLineOption startOnly("start-only", "Show the window and end: for benchmarks.");
+    parser.addOptions({pictures, examples, startOnly});
     parser.process(app);
     if (parser.isSet(pictures))
         return WriteWindowPictures(parser.value(pictures), parser.value(examples)) ? 1 : 0;
@@ -34,5 +36,6 @@ int main(int argc, char** argv)
         (void)window.OfferRecovery();
     else
         (void)window.Open(parser.positionalArguments().first());
+    if (parser.isSet(startOnly)) QTimer::singleShot(0, &app, &QApplication::quit);
     return QApplication::exec();
 }

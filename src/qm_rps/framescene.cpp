@@ -82,7 +82,8 @@ void CFrameScene::Build()
         const T_ENDS<bool> has = ends == hinged.end() ? T_ENDS<bool>{} : ends->second;
         m_scene.lines.push_back({id, at[e.nodeI], at[e.nodeJ], e.kind, has.I, has.J});
     }
-    m_revision = m_doc.Data().Revision();
+    m_revision = m_scene.revision = m_doc.Data().Revision();
+    m_pushover = 0;
 }
 
 const T_FRAME_SCENE& CFrameScene::Scene()
@@ -138,22 +139,39 @@ int CFrameScene::FlatAxis(const T_FRAME_SCENE& scene)
     return -1;
 }
 
+/// All steps at once: a slider then reads no file.
+int CFrameScene::ReadSeries(int key)
+{
+    if (m_pushover == key) return 1;
+    const auto result = m_doc.Data().Content().results.find(key);
+    if (result == m_doc.Data().Content().results.end()) return 0;
+    const T_UNITS units = m_doc.Unit().Units();
+    std::vector<std::vector<double>> series(m_scene.nodes.size());
+    for (std::size_t n = 0; n < series.size(); ++n) {
+        if (!result->second->HasNode(m_scene.nodes[n].id)) continue;
+        if (!result->second->ReadDisplacements(m_scene.nodes[n].id, series[n])) {
+            m_error = result->second->Error();
+            return 0;
+        }
+        for (double& u : series[n])
+            u = FromSi(u, units, kDimLength);
+    }
+    m_series = std::move(series);
+    m_pushover = key;
+    return 1;
+}
+
 int CFrameScene::ReadPushover(int key, int step, T_MOVES& out)
 {
-    CPostCtrl& post = m_doc.Post();
     const auto push = m_doc.Data().Model().pushovers.find(key);
-    if (push == m_doc.Data().Model().pushovers.end() || !post.SelectPushover(key) ||
-        !post.SelectStep(step)) {
-        m_error = post.Error();
-        return 0;
-    }
-    const int direction = push->second.direction - 1;
-    return ReadNodes(
-        [&](int node, T_DOF6& values) {
-            if (direction > 2 || !post.ExistNodePost(node)) return 1; // a rotation moves no node
-            return post.GetDispNew(node, values[static_cast<std::size_t>(direction)]);
-        },
-        out);
+    if (push == m_doc.Data().Model().pushovers.end() || step < 1) return 0;
+    const auto direction = static_cast<std::size_t>(push->second.direction - 1);
+    if (direction < 3 && !ReadSeries(key)) return 0;
+    out.assign(m_scene.nodes.size(), {});
+    const auto index = static_cast<std::size_t>(step - 1);
+    for (std::size_t n = 0; direction < 3 && n < out.size(); ++n) // a rotation moves no node
+        if (index < m_series[n].size()) out[n][direction] = m_series[n][index];
+    return 1;
 }
 
 int CFrameScene::Read(const T_SHAPE_SOURCE& source, int step, T_MOVES& out)

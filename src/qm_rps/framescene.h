@@ -21,6 +21,7 @@ struct T_FRAME_SCENE {
     std::string title, lengthUnit;
     std::vector<T_SCENE_NODE> nodes; // ascending ids
     std::vector<T_SCENE_LINE> lines;
+    long revision = 0; // of the document
 };
 
 /// A result that the frame can be shown under.
@@ -67,6 +68,7 @@ private:
     using T_MOVES = std::vector<std::array<double, 3>>;
     void Build();
     int ReadPushover(int key, int step, T_MOVES& out);
+    int ReadSeries(int key);
     template <class F>
     int ReadNodes(F read, T_MOVES& out);
 
@@ -74,4 +76,8 @@ private:
     T_FRAME_SCENE m_scene;
     long m_revision = -1;
     std::string m_error;
+    // Of the pushover load case that was read last: displacements by node, all steps. A node
+    // without results has none.
+    int m_pushover = 0;
+    std::vector<std::vector<double>> m_series;
 };

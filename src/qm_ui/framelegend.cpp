@@ -19,6 +19,7 @@ using zql::lib::MMSGFunction;
 
 constexpr double kPad = 8.0;
 constexpr double kSwatch = 26.0;
+constexpr double kTextPx = 12.0;
 constexpr double kDriftWidth = 190.0;
 
 QString Text(const char* key)
@@ -73,9 +74,9 @@ std::vector<T_ENTRY> Entries(const T_FRAME_PICTURE& picture, const T_FRAME_OPTIO
 }
 
 /// In lines from the bottom up; the height that they take.
-double DrawEntries(QPainter& painter, const QRectF& rect, const std::vector<T_ENTRY>& entries)
+double DrawEntries(QPainter* painter, const QRectF& rect, const std::vector<T_ENTRY>& entries)
 {
-    const QFontMetricsF metrics(painter.font());
+    const QFontMetricsF metrics(CPlot::Font(kTextPx, false));
     const double line = metrics.height() + 4;
     std::vector<std::vector<std::pair<double, const T_ENTRY*>>> rows(1);
     double x = rect.left() + kPad;
@@ -88,37 +89,43 @@ double DrawEntries(QPainter& painter, const QRectF& rect, const std::vector<T_EN
         rows.back().emplace_back(x, &e);
         x += w;
     }
-    double y = rect.bottom() - kPad / 2 - line * static_cast<double>(rows.size());
+    const double height = kPad / 2 + line * static_cast<double>(rows.size());
+    if (!painter) return height;
+    double y = rect.bottom() - height;
     for (const auto& row : rows) {
         for (const auto& [at, entry] : row) {
-            entry->swatch(painter, {at + kSwatch / 2, y + line / 2});
-            painter.setPen(Qt::black);
-            painter.drawText(QRectF(at + kSwatch + 6, y, rect.right() - at, line),
-                             Qt::AlignLeft | Qt::AlignVCenter, entry->text);
+            entry->swatch(*painter, {at + kSwatch / 2, y + line / 2});
+            painter->setPen(Qt::black);
+            painter->drawText(QRectF(at + kSwatch + 6, y, rect.right() - at, line),
+                              Qt::AlignLeft | Qt::AlignVCenter, entry->text);
         }
         y += line;
     }
-    return kPad / 2 + line * static_cast<double>(rows.size());
+    return height;
 }
 
-double DrawTitles(QPainter& painter, const QRectF& rect, const T_FRAME_PICTURE& picture)
+double DrawTitles(QPainter* painter, const QRectF& rect, const T_FRAME_PICTURE& picture)
 {
     double y = rect.top() + kPad / 2;
     const auto line = [&](const std::string& text, double px, bool bold) {
         if (text.empty()) return;
-        painter.setFont(CPlot::Font(px, bold));
-        painter.setPen(Qt::black);
-        const QFontMetricsF metrics(painter.font());
-        painter.drawText(QRectF(rect.left() + kPad, y, rect.width() - 2 * kPad, metrics.height()),
-                         Qt::AlignHCenter | Qt::AlignVCenter,
-                         metrics.elidedText(QString::fromStdString(text), Qt::ElideRight,
-                                            rect.width() - 2 * kPad));
+        const QFont font = CPlot::Font(px, bold);
+        const QFontMetricsF metrics(font);
+        if (painter) {
+            painter->setFont(font);
+            painter->setPen(Qt::black);
+            painter->drawText(
+                QRectF(rect.left() + kPad, y, rect.width() - 2 * kPad, metrics.height()),
+                Qt::AlignHCenter | Qt::AlignVCenter,
+                metrics.elidedText(QString::fromStdString(text), Qt::ElideRight,
+                                   rect.width() - 2 * kPad));
+        }
         y += metrics.height() + 1;
     };
     line(picture.scene->title, 15.0, true);
     line(picture.subtitle, 12.5, false);
-    line(picture.note, 12.0, false);
-    painter.setFont(CPlot::Font(12.0, false));
+    line(picture.note, kTextPx, false);
+    if (painter) painter->setFont(CPlot::Font(kTextPx, false));
     return y - rect.top();
 }
 
@@ -163,7 +170,7 @@ QPen FramePen(ELEM_KIND kind, bool faint, bool thick)
     }
 }
 
-QRectF DrawFrameLegend(QPainter& painter, const QRectF& rect, const T_FRAME_PICTURE& picture,
+QRectF DrawFrameLegend(QPainter* painter, const QRectF& rect, const T_FRAME_PICTURE& picture,
                        const T_FRAME_OPTIONS& options)
 {
     const double above = DrawTitles(painter, rect, picture);
@@ -172,7 +179,7 @@ QRectF DrawFrameLegend(QPainter& painter, const QRectF& rect, const T_FRAME_PICT
     if (options.drifts && !picture.drifts.empty() && area.width() > 2.5 * kDriftWidth) {
         const QRectF side(area.right() - kDriftWidth, area.top() + kPad, kDriftWidth - kPad,
                           area.height() - 2 * kPad);
-        DrawDrifts(painter, side, picture.drifts);
+        if (painter) DrawDrifts(*painter, side, picture.drifts);
         area.setRight(side.left() - kPad);
     }
     return area;

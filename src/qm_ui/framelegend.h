@@ -12,6 +12,7 @@ inline const QColor kHingeColor{0xef, 0x6c, 0x00};
 /// Pen of the lines of a kind of elements; faint: of the frame as it was.
 QPen FramePen(ELEM_KIND kind, bool faint, bool thick);
 
-/// Draws titles above, the legend below and drift bars at the right; returns what is left.
-QRectF DrawFrameLegend(QPainter& painter, const QRectF& rect, const T_FRAME_PICTURE& picture,
+/// Draws titles above, the legend below and drift bars at the right; returns what is left. Without
+/// a painter it only measures.
+QRectF DrawFrameLegend(QPainter* painter, const QRectF& rect, const T_FRAME_PICTURE& picture,
                        const T_FRAME_OPTIONS& options);

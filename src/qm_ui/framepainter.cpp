@@ -67,8 +67,8 @@ void DrawTriad(QPainter& painter, const QRectF& area, const T_AXES& axes)
 } // namespace
 
 /// Node places on the page. The frame without displacements fits at zoom 1.
-void CFramePainter::Place(const T_FRAME_PICTURE& picture, const T_CAMERA& camera,
-                          const QRectF& area)
+void CFramePainter::PlaceDesign(const T_FRAME_PICTURE& picture, const T_CAMERA& camera,
+                                const QRectF& area)
 {
     const auto& nodes = picture.scene->nodes;
     const T_AXES axes = AxesOf(camera);
@@ -90,11 +90,19 @@ void CFramePainter::Place(const T_FRAME_PICTURE& picture, const T_CAMERA& camera
     const double cx = 0.5 * (left + right), cy = 0.5 * (low + high);
     for (QPointF& p : m_design)
         p = {centre.x() + px * (p.x() - cx), centre.y() - px * (p.y() - cy)};
+    m_pxPerLength = px;
+}
+
+void CFramePainter::PlaceMoved(const T_FRAME_PICTURE& picture, const T_CAMERA& camera)
+{
+    const auto& nodes = picture.scene->nodes;
+    const T_AXES axes = AxesOf(camera);
     m_moved = m_design;
     if (!picture.displacement || picture.displacement->size() != nodes.size()) return;
     for (std::size_t n = 0; n < nodes.size(); ++n) {
         const auto& move = (*picture.displacement)[n];
-        m_moved[n] += px * picture.scale * QPointF(Dot(move, axes.right), -Dot(move, axes.up));
+        m_moved[n] +=
+            m_pxPerLength * picture.scale * QPointF(Dot(move, axes.right), -Dot(move, axes.up));
     }
 }
 
@@ -173,17 +181,32 @@ void CFramePainter::DrawNumbers(QPainter& painter, const QRectF& area,
             draw(0.5 * (m_moved[line.i] + m_moved[line.j]), line.id, QColor(0x00, 0x60, 0x64));
 }
 
-void CFramePainter::Draw(QPainter& painter, const QRectF& rect, const T_FRAME_PICTURE& picture,
-                         const T_CAMERA& camera, const T_FRAME_OPTIONS& options)
+void CFramePainter::DrawBackground(QPainter& painter, const QRectF& rect,
+                                   const T_FRAME_PICTURE& picture, const T_CAMERA& camera,
+                                   const T_FRAME_OPTIONS& options)
 {
     painter.fillRect(rect, Qt::white);
-    if (!picture.scene) return;
+    if (!picture.scene || picture.scene->nodes.empty()) return;
+    const T_FRAME_SCENE& scene = *picture.scene;
     painter.save();
     painter.setClipRect(rect);
-    painter.setFont(CPlot::Font(12.0, false));
+    PlaceDesign(picture, camera, DrawFrameLegend(nullptr, rect, picture, options));
+    painter.setRenderHint(QPainter::Antialiasing, scene.lines.size() <= kSmooth);
+    if (picture.displacement && options.undeformed) DrawLines(painter, scene, m_design, true);
+    painter.setRenderHint(QPainter::Antialiasing, true);
+    if (options.supports) DrawSupports(painter, scene);
+    painter.restore();
+}
+
+void CFramePainter::DrawForeground(QPainter& painter, const QRectF& rect,
+                                   const T_FRAME_PICTURE& picture, const T_CAMERA& camera,
+                                   const T_FRAME_OPTIONS& options)
+{
+    if (!picture.scene) return;
     const T_FRAME_SCENE& scene = *picture.scene;
-    const bool moved = picture.displacement != nullptr;
-    const QRectF area = DrawFrameLegend(painter, rect, picture, options);
+    painter.save();
+    painter.setClipRect(rect);
+    const QRectF area = DrawFrameLegend(&painter, rect, picture, options);
     if (scene.nodes.empty()) {
         painter.drawText(
             area, Qt::AlignCenter,
@@ -191,17 +214,22 @@ void CFramePainter::Draw(QPainter& painter, const QRectF& rect, const T_FRAME_PI
         painter.restore();
         return;
     }
-    Place(picture, camera, area);
+    PlaceMoved(picture, camera);
     painter.setRenderHint(QPainter::Antialiasing, scene.lines.size() <= kSmooth);
-    if (moved && options.undeformed) DrawLines(painter, scene, m_design, true);
     DrawLines(painter, scene, m_moved, false);
     painter.setRenderHint(QPainter::Antialiasing, true);
     if (scene.lines.empty()) DrawNodes(painter);
-    if (options.supports) DrawSupports(painter, scene);
     if (options.hinges) DrawHinges(painter, scene);
     if (options.nodeNumbers || options.elementNumbers) DrawNumbers(painter, area, picture, options);
     DrawTriad(painter, area, AxesOf(camera));
     painter.restore();
+}
+
+void CFramePainter::Draw(QPainter& painter, const QRectF& rect, const T_FRAME_PICTURE& picture,
+                         const T_CAMERA& camera, const T_FRAME_OPTIONS& options)
+{
+    DrawBackground(painter, rect, picture, camera, options);
+    DrawForeground(painter, rect, picture, camera, options);
 }
 
 long CFramePainter::NodeAt(QPointF place) const

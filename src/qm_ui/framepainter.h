@@ -46,14 +46,22 @@ struct T_FRAME_PICTURE {
 /// Lengths are px at 96 dpi. State: buffers that are used again for the next picture.
 class CFramePainter {
 public:
+    /// The whole picture: background, then foreground.
     void Draw(QPainter& painter, const QRectF& rect, const T_FRAME_PICTURE& picture,
               const T_CAMERA& camera, const T_FRAME_OPTIONS& options);
+    /// What does not change with the displacements, so that a window can keep it: ground, frame as
+    /// it was, supports.
+    void DrawBackground(QPainter& painter, const QRectF& rect, const T_FRAME_PICTURE& picture,
+                        const T_CAMERA& camera, const T_FRAME_OPTIONS& options);
+    void DrawForeground(QPainter& painter, const QRectF& rect, const T_FRAME_PICTURE& picture,
+                        const T_CAMERA& camera, const T_FRAME_OPTIONS& options);
 
     /// The node of the latest picture nearest to a place, within 10 px; -1: none.
     [[nodiscard]] long NodeAt(QPointF place) const;
 
 private:
-    void Place(const T_FRAME_PICTURE& picture, const T_CAMERA& camera, const QRectF& area);
+    void PlaceDesign(const T_FRAME_PICTURE& picture, const T_CAMERA& camera, const QRectF& area);
+    void PlaceMoved(const T_FRAME_PICTURE& picture, const T_CAMERA& camera);
     void DrawLines(QPainter& painter, const T_FRAME_SCENE& scene, const std::vector<QPointF>& at,
                    bool faint);
     void DrawNodes(QPainter& painter) const;
@@ -63,5 +71,6 @@ private:
                      const T_FRAME_OPTIONS& options) const;
 
     std::vector<QPointF> m_design, m_moved; // nodes on the page
+    double m_pxPerLength = 1.0;
     std::vector<QLineF> m_lines;
 };

@@ -47,10 +47,34 @@ void CFrameView::SetOptions(const T_FRAME_OPTIONS& options)
     update();
 }
 
+CFrameView::T_KEPT CFrameView::Key() const
+{
+    const std::size_t lines =
+        (m_picture.subtitle.empty() ? 0U : 1U) + (m_picture.note.empty() ? 0U : 1U);
+    return {m_picture.scene,
+            m_picture.scene ? m_picture.scene->revision : 0,
+            m_picture.displacement != nullptr,
+            lines,
+            !m_picture.drifts.empty(),
+            m_camera,
+            m_options,
+            size()};
+}
+
 void CFrameView::paintEvent(QPaintEvent*)
 {
+    const QRectF area(rect());
+    const T_KEPT key = Key();
+    if (key != m_kept || m_background.isNull()) {
+        m_background = QPixmap(size() * devicePixelRatio());
+        m_background.setDevicePixelRatio(devicePixelRatio());
+        QPainter painter(&m_background);
+        m_painter.DrawBackground(painter, area, m_picture, m_camera, m_options);
+        m_kept = key;
+    }
     QPainter painter(this);
-    m_painter.Draw(painter, QRectF(rect()), m_picture, m_camera, m_options);
+    painter.drawPixmap(0, 0, m_background);
+    m_painter.DrawForeground(painter, area, m_picture, m_camera, m_options);
 }
 
 QString CFrameView::ReadOut(QPointF place) const

@@ -3,6 +3,7 @@
 
 #include "qm_ui/framepainter.h"
 
+#include <QPixmap>
 #include <QPoint>
 #include <QWidget>
 
@@ -41,5 +42,20 @@ private:
     T_CAMERA m_camera;
     T_FRAME_OPTIONS m_options;
     CFramePainter m_painter;
+    /// What the background at hand was drawn for; another picture of the same frame keeps it.
+    struct T_KEPT {
+        const T_FRAME_SCENE* scene = nullptr;
+        long revision = 0;
+        bool moved = false;
+        std::size_t lines = 0; // titles that are shown: they move the frame
+        bool drifts = false;
+        T_CAMERA camera;
+        T_FRAME_OPTIONS options;
+        QSize size;
+        bool operator==(const T_KEPT&) const = default;
+    };
+    T_KEPT Key() const;
+    T_KEPT m_kept;
+    QPixmap m_background;
     QPointF m_grab;
 };

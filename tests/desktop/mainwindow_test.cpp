@@ -166,3 +166,26 @@ TEST_F(MainWindow, PicturesOfTheFrameAreWrittenInEveryFormat)
     Run("IDS_QM_UI_EXPORT_PICTURE");
     EXPECT_TRUE(answers.m_texts.value(0).contains("a.gif"));
 }
+
+TEST_F(MainWindow, EditsOfASessionThatCrashedAreOfferedAndRecovered)
+{
+    ASSERT_TRUE(Open("cable-stayed-bridge"));
+    AnswerFileName(File("bridge.qmdb"));
+    Run("IDS_QM_UI_SAVE_AS");
+    CGridView& table = m_main->Explorer().Table();
+    ASSERT_TRUE(table.Model().setData(table.Model().index(1, 1), "12.5", Qt::EditRole));
+    m_main->Desktop().frame.OnTick(1e6);
+    m_main->Desktop().frame.OnTick(2e6);
+    ASSERT_TRUE(QFileInfo::exists(File("bridge.qmdb.auto-1")));
+    for (const bool wanted : {false, true}) {
+        m_main.reset(); // without closing: as a crash leaves it
+        m_main = std::make_unique<CMainWindow>();
+        CAnswers answers({CAnswers::Press(wanted ? QMessageBox::Yes : QMessageBox::No)});
+        ASSERT_TRUE(m_main->Open(File("bridge.qmdb")));
+        const double x = m_main->Doc().Data().Model().nodes.at(2).xyz[0];
+        EXPECT_EQ(wanted ? 12.5 : 10.0, x);
+    }
+    EXPECT_TRUE(m_main->windowTitle().contains('*'));
+    Run("IDS_QM_UI_SAVE");
+    EXPECT_FALSE(QFileInfo::exists(File("bridge.qmdb.auto-1")));
+}
