@@ -19,10 +19,10 @@ EXIT_CODE CheckPlotName(const std::string& path)
 {
     if (path.empty()) return EXIT_CODE::Done;
 #ifdef QM_UI
-    for (const char* extension : {".svg", ".png", ".pdf"}) {
+    for (const char* extension : {".svg", ".pdf", ".png", ".jpg", ".jpeg", ".bmp"}) {
         if (path.ends_with(extension)) return EXIT_CODE::Done;
     }
-    return Complain(EXIT_CODE::Usage, path + ": a picture is .svg, .png or .pdf");
+    return Complain(EXIT_CODE::Usage, path + ": a picture is .svg, .pdf, .png, .jpg or .bmp");
 #else
     return Complain(EXIT_CODE::Usage, path + ": this qm-rps was built without pictures");
 #endif

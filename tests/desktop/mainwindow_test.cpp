@@ -2,9 +2,11 @@
 #include "explorerpane.h"
 
 #include <QAction>
+#include <QDir>
 #include <QFile>
 #include <QFileInfo>
 #include <QLineEdit>
+#include <QLocale>
 #include <QSlider>
 
 using namespace desktop_test;
@@ -188,4 +190,33 @@ TEST_F(MainWindow, EditsOfASessionThatCrashedAreOfferedAndRecovered)
     EXPECT_TRUE(m_main->windowTitle().contains('*'));
     Run("IDS_QM_UI_SAVE");
     EXPECT_FALSE(QFileInfo::exists(File("bridge.qmdb.auto-1")));
+}
+
+TEST_F(MainWindow, AFileThatCanNotBeWrittenIsToldAndTheEditsStay)
+{
+    ASSERT_TRUE(Open("cable-stayed-bridge"));
+    CGridView& table = m_main->Explorer().Table();
+    ASSERT_TRUE(table.Model().setData(table.Model().index(1, 1), "12.5", Qt::EditRole));
+    QDir().mkpath(File("folder.qmdb"));
+    for (const char* name : {"folder.qmdb", "no/such/folder/a.qmdb"}) {
+        AnswerFileName(File(name));
+        CAnswers answers({CAnswers::Accept()});
+        Run("IDS_QM_UI_SAVE_AS");
+        EXPECT_TRUE(answers.m_texts.value(0).contains(name)) << name;
+        EXPECT_TRUE(m_main->Doc().Data().IsModified()) << name;
+    }
+}
+
+TEST_F(MainWindow, TablesFollowTheLocaleOfTheDesktop)
+{
+    ASSERT_TRUE(Open("cable-stayed-bridge"));
+    QLocale::setDefault(QLocale(QLocale::Italian, QLocale::Italy));
+    CGridView& table = m_main->Explorer().Table();
+    ASSERT_TRUE(table.Model().setData(table.Model().index(1, 1), "12,5", Qt::EditRole));
+    EXPECT_EQ("12,5", table.Model().index(1, 1).data().toString());
+    table.setCurrentIndex(table.Model().index(2, 1));
+    EXPECT_EQ(1, table.PasteText("7,25\t1"));
+    EXPECT_EQ(7.25, m_main->Doc().Data().Model().nodes.at(3).xyz[0]);
+    EXPECT_EQ(1.0, m_main->Doc().Data().Model().nodes.at(3).xyz[1]);
+    QLocale::setDefault(QLocale::c());
 }

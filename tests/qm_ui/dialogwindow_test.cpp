@@ -13,6 +13,7 @@
 #include <QLineEdit>
 #include <QLocale>
 #include <QMessageBox>
+#include <QScreen>
 #include <QTimer>
 #include <gtest/gtest.h>
 
@@ -197,4 +198,18 @@ TEST_F(DialogWindow, TablesAreEditedCopiedAndPastedWithFullPrecision)
     grid->selectAll();
     Key(grid, Qt::Key_C, {}, Qt::ControlModifier);
     EXPECT_EQ("0.123457\n7.000000\n8.000000", QGuiApplication::clipboard()->text());
+}
+
+TEST_F(DialogWindow, AFormLargerThanTheScreenScrolls)
+{
+    CViewFactory factory;
+    factory.Register<CSpanDlg>(PlainLabel("Tall"), [](CFormView& form, CSpanDlg& d) {
+        for (int i = 0; i < 200; ++i)
+            form.Number(PlainLabel("low"), Ref(d.m_low));
+    });
+    CDialogWindow window(factory, *factory.Find(m_model), m_model, nullptr);
+    window.show();
+    QApplication::processEvents();
+    EXPECT_LE(window.height(), window.screen()->availableSize().height());
+    EXPECT_GT(window.Form().height(), window.height());
 }
