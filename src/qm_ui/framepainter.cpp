@@ -54,7 +54,7 @@ void DrawTriad(QPainter& painter, const QRectF& area, const T_AXES& axes)
     const std::array<std::pair<const char*, QColor>, 3> names{{{"X", QColor(0xc6, 0x28, 0x28)},
                                                                {"Y", QColor(0x2e, 0x7d, 0x32)},
                                                                {"Z", QColor(0x15, 0x65, 0xc0)}}};
-    const QPointF from = area.bottomLeft() + QPointF(14, -14);
+    const QPointF from = area.bottomLeft() + QPointF(14, -30);
     for (std::size_t d = 0; d < 3; ++d) {
         const QPointF tip = from + kLength * QPointF(axes.right[d], -axes.up[d]);
         if (QLineF(from, tip).length() < 3.0) continue; // it points at the viewer
