@@ -112,7 +112,6 @@ WINDOW RunWindow(CMainWindow& main)
     run->SetView(&view);
     const int done = run->OnRun();
     run->SetView(nullptr);
-    main.Doc().NewModel(); // lets the file go
     return done ? WindowOf(main, std::move(run)) : nullptr;
 }
 

@@ -6,7 +6,8 @@
 
 class CUlfExplanationDlg : public zql::frx::MDialog {
 public:
-    /// item: its name; message: of the calculation, told before the explanation; may be empty.
+    /// item: its name; message: of the calculation; may be empty. Told before the explanation of a
+    /// solution; without a solution the explanation has it.
     CUlfExplanationDlg(std::string item, std::string message, T_ULF_EXPLAINED explained)
         : m_item(std::move(item)), m_message(std::move(message)), m_explained(std::move(explained))
     {
@@ -17,7 +18,7 @@ public:
     /// All of it in words, a paragraph for each statement.
     std::string Text() const
     {
-        std::string text = m_message;
+        std::string text = m_explained.solved ? m_message : std::string();
         for (const std::string& line : m_explained.lines)
             text += (text.empty() ? "" : "\n\n") + line;
         return text;

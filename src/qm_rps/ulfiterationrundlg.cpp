@@ -8,6 +8,7 @@
 #include "qm_rps/unknownloadfactorresultdlg.h"
 
 #include <algorithm>
+#include <filesystem>
 
 using zql::lib::MMSGFunction;
 
@@ -218,7 +219,8 @@ std::string CUlfIterationRunDlg::StepText(std::size_t row, std::size_t column) c
     if (row >= m_history.size()) return {};
     const T_ULF_ITER_STEP& step = m_history[row];
     if (column == 0) return std::to_string(step.iteration);
-    return column == 1 ? FormatText("%.6g", step.tolerance) : step.file;
+    return column == 1 ? FormatText("%.6g", step.tolerance)
+                       : std::filesystem::path(step.file).filename().string();
 }
 
 std::size_t CUlfIterationRunDlg::Rows() const

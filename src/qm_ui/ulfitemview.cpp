@@ -240,6 +240,7 @@ void BuildStage(CFormView& form, STAGE& item, const T_ULF_HOOKS& hooks)
     form.Columns();
     AddWay(form, item);
     form.Flag(KeyText("IDS_QM_UI_ULF_SUM_LOADS"), Ref(item.m_sumStageLoads));
+    AddUlfFiller(form);
     form.NextColumn();
     AddChecks(form, item, {420, 130});
     form.EndColumns();

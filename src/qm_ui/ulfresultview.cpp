@@ -6,8 +6,6 @@
 
 #include <QDate>
 
-#include <algorithm>
-
 namespace {
 
 using RESULT = CUnknownLoadFactorResultDlg;
@@ -88,10 +86,7 @@ void BuildResult(CFormView& form, RESULT& result, const T_ULF_HOOKS& hooks)
     AddUlfGrid(form, ConstraintGrid(result), {560, 300});
     form.EndColumns();
     form.Page(KeyText("IDS_QM_UI_ULF_PICTURE"));
-    CFormField& picture = form.Picture([&result] { return UlfPlot(UlfPictureOf(result)); });
-    constexpr int kLeast = 360, kMost = 4000; // px
-    const int height = static_cast<int>(UlfPlot(UlfPictureOf(result)).pageHeight);
-    picture.widget->setMinimumHeight(std::clamp(height, kLeast, kMost));
+    AddUlfPicture(form, [&result] { return UlfPlot(UlfPictureOf(result)); });
     form.EndPages();
     form.Columns();
     AddExport(form, result, hooks);
@@ -106,6 +101,7 @@ void BuildExplanation(CFormView& form, CUlfExplanationDlg& explanation)
 {
     form.Group(PlainLabel(explanation.Item()));
     form.Note([&explanation] { return explanation.Text(); });
+    AddUlfFiller(form);
     form.EndGroup();
 }
 

@@ -34,6 +34,12 @@ std::vector<T_GRID_COLUMN> UlfColumns(const std::array<const char*, N>& heads,
 /// Adds a table of at least this size in px.
 CFormField& AddUlfGrid(CFormView& form, T_GRID_BINDING binding, QSize least);
 
+/// Adds a picture that scrolls where it is less high than it needs to be.
+CFormField& AddUlfPicture(CFormView& form, std::function<T_PLOT()> plot);
+
+/// Takes the room that is left below the fields of a column.
+void AddUlfFiller(CFormView& form);
+
 /// Adds a row of buttons; each gives what was typed to the model before it does its work.
 struct T_ULF_BUTTON {
     const char* key;
