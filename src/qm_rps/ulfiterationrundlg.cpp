@@ -202,6 +202,7 @@ int CUlfIterationRunDlg::Start()
     run.m_progress = [&](int iterations, int required) {
         std::string status = tellDone(iterations, required);
         if (status != m_status) Tell(std::move(status));
+        if (View()) View()->DispatchEvents(); // a cancel that came while the factors were found
         return !m_cancel;
     };
     zql::frx::IDialogView* const before = item.View();

@@ -81,9 +81,9 @@ void BuildResult(CFormView& form, RESULT& result, const T_ULF_HOOKS& hooks)
 {
     form.Page(KeyText("IDS_QM_UI_ULF_TABLES"));
     form.Columns();
-    AddUlfGrid(form, FactorGrid(result), {300, 300});
+    AddUlfGrid(form, FactorGrid(result), {280, 300});
     form.NextColumn();
-    AddUlfGrid(form, ConstraintGrid(result), {560, 300});
+    AddUlfGrid(form, ConstraintGrid(result), {760, 300});
     form.EndColumns();
     form.Page(KeyText("IDS_QM_UI_ULF_PICTURE"));
     AddUlfPicture(form, [&result] { return UlfPlot(UlfPictureOf(result)); });
@@ -111,7 +111,7 @@ void RegisterUlfResultViews(CViewFactory& factory, const T_ULF_HOOKS& hooks)
 {
     T_VIEW shows;
     shows.showsOnly = true;
-    shows.size = {1000, 620};
+    shows.size = {1200, 640};
     factory.Register<RESULT>(
         KeyText("IDS_QM_UI_ULF_RESULT_TITLE"),
         [hooks](CFormView& form, RESULT& result) { BuildResult(form, result, hooks); }, shows);
