@@ -13,6 +13,7 @@
 #include "qm_rps/unknowntabletabgrid1.h"
 #include "qm_ui/dialogwindow.h"
 
+#include <QTabWidget>
 #include <QTemporaryDir>
 
 namespace {
@@ -55,7 +56,7 @@ WINDOW ResultWindow(CMainWindow& main, int item)
                     std::make_unique<CUnknownLoadFactorResultDlg>(main.Doc(), *dialog.Result()));
 }
 
-/// With the calculation done; `explain`: the window of its explanation.
+/// Of the calculation of an item.
 WINDOW ExplanationWindow(CMainWindow& main, int item)
 {
     CUnknownLoadFactorItemDlg dialog(main.Doc(), item);
@@ -141,6 +142,12 @@ std::vector<T_WINDOW_EXAMPLE> UlfWindowExamples()
             {"ulf-constraints", kBridge, WindowMaker<CUnknownTableTabGrid1>()},
             {"ulf-constraint", kBeam, WindowMaker<CUnknownLoadFactorConstraintDlg>(13)},
             {"ulf-result", kBridge, result(2)},
+            {"ulf-result-picture", kBridge,
+             [](CMainWindow& main) {
+                 WINDOW window = ResultWindow(main, 2);
+                 if (window) window->findChild<QTabWidget*>()->setCurrentIndex(1);
+                 return window;
+             }},
             {"ulf-result-beam", kBeam, result(1)},
             {"ulf-explanation", kBeam, [](CMainWindow& m) { return ExplanationWindow(m, 4); }},
             {"ulf-stage-item", "cable-stayed-bridge-staged", StageItemWindow},

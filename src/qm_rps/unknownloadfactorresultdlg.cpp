@@ -27,21 +27,27 @@ int CUnknownLoadFactorResultDlg::Refuse(const char* key, const std::string& name
 }
 
 CUnknownLoadFactorResultDlg::CUnknownLoadFactorResultDlg(CDBDoc& doc, T_ULF_RESULT result)
-    : m_doc(doc), m_result(std::move(result)), m_rows(UlfResultRows(m_result))
+    : m_doc(doc), m_result(std::move(result))
 {
     m_sheet.fileName = std::filesystem::path(doc.Path()).filename().string();
 }
 
+const T_ULF_RESULT_ROW& CUnknownLoadFactorResultDlg::RowAt(std::size_t constraint) const
+{
+    if (m_rows.empty()) m_rows = UlfResultRows(m_result);
+    return m_rows.at(constraint);
+}
+
 CUnknownLoadFactorResultDlg::STATE CUnknownLoadFactorResultDlg::StateOf(std::size_t i) const
 {
-    const T_ULF_RESULT_ROW& row = m_rows.at(i);
+    const T_ULF_RESULT_ROW& row = RowAt(i);
     return !row.met ? STATE::NotMet : row.active ? STATE::Active : STATE::Within;
 }
 
 std::string CUnknownLoadFactorResultDlg::UnitOf(std::size_t i) const
 {
     T_ULFC_D c;
-    if (!m_doc.Attr().GetUlfc_(m_rows.at(i).name, c)) return {};
+    if (!m_doc.Attr().GetUlfc_(RowAt(i).name, c)) return {};
     return UlfUnitText(c.type, c.component, m_doc.Unit().Units());
 }
 
@@ -60,7 +66,7 @@ std::string CUnknownLoadFactorResultDlg::FactorText(std::size_t row, std::size_t
 
 std::string CUnknownLoadFactorResultDlg::ConstraintText(std::size_t i, std::size_t column) const
 {
-    const T_ULF_RESULT_ROW& row = m_rows.at(i);
+    const T_ULF_RESULT_ROW& row = RowAt(i);
     const double scale = UlfScale(m_result, i);
     switch (column) {
     case 0:

@@ -65,10 +65,11 @@ public:
     const std::string& Outcome() const { return m_outcome; }
 
 private:
+    const T_ULF_RESULT_ROW& RowAt(std::size_t constraint) const;
     int Refuse(const char* key, const std::string& name = {});
 
     CDBDoc& m_doc;
     T_ULF_RESULT m_result;
-    std::vector<T_ULF_RESULT_ROW> m_rows;
+    mutable std::vector<T_ULF_RESULT_ROW> m_rows; // made for the first cell that is shown
     std::string m_outcome;
 };

@@ -64,15 +64,15 @@ void AddHead(CFormView& form, CUlfItemDialog& item)
 
 void AddWay(CFormView& form, CUlfItemDialog& item)
 {
-    const auto keys = [](const auto& list) {
-        return KeyTexts(std::vector<std::string>(list.begin(), list.end()));
+    const auto add = [&form](const char* caption, const char* name, int& index, const auto& keys) {
+        CFormField& field =
+            form.Choice(KeyText(caption), IndexRef(index),
+                        KeyTexts(std::vector<std::string>(keys.begin(), keys.end())));
+        field.name = name;
+        field.widget->setSizePolicy(QSizePolicy::MinimumExpanding, QSizePolicy::Fixed);
     };
-    form.Choice(KeyText("IDS_QM_UI_ULF_OBJECTIVE"), IndexRef(item.m_objective),
-                keys(CUlfItemDialog::kObjectiveKeys))
-        .name = "objective";
-    form.Choice(KeyText("IDS_QM_UI_ULF_SIGN"), IndexRef(item.m_sign),
-                keys(CUlfItemDialog::kSignKeys))
-        .name = "sign";
+    add("IDS_QM_UI_ULF_OBJECTIVE", "objective", item.m_objective, CUlfItemDialog::kObjectiveKeys);
+    add("IDS_QM_UI_ULF_SIGN", "sign", item.m_sign, CUlfItemDialog::kSignKeys);
     form.Flag(KeyText("IDS_QM_UI_ULF_EQUATIONS"), Ref(item.m_solveByEquations));
 }
 
@@ -217,7 +217,7 @@ void AddRows(CFormView& form, STAGE& item)
 {
     const auto chosen = std::make_shared<int>(-1);
     form.Group(KeyText("IDS_QM_UI_ULF_LOADS_AT_STAGES"));
-    AddUlfGrid(form, RowGrid(item, chosen), {760, 190}).name = "rows";
+    AddUlfGrid(form, RowGrid(item, chosen), {700, 190}).name = "rows";
     AddUlfButtons(form, {{"IDS_QM_UI_ULF_ADD_ROW",
                           [&item, chosen] {
                               item.OnAddRow();
@@ -242,7 +242,7 @@ void BuildStage(CFormView& form, STAGE& item, const T_ULF_HOOKS& hooks)
     form.Flag(KeyText("IDS_QM_UI_ULF_SUM_LOADS"), Ref(item.m_sumStageLoads));
     AddUlfFiller(form);
     form.NextColumn();
-    AddChecks(form, item, {420, 130});
+    AddChecks(form, item, {340, 130});
     form.EndColumns();
     AddUlfButtons(form,
                   {{"IDS_QM_UI_ULF_SOLVE", [&form, &item, hooks] { Solve(form, item, hooks); }},

@@ -146,11 +146,11 @@ void BuildRun(CFormView& form, RUN& run)
     run.m_changed = [&form] { form.Refresh(); };
     AddRunHead(form, run);
     form.Columns();
-    AddUlfGrid(form, StepGrid(run), {480, 150});
+    AddUlfGrid(form, StepGrid(run), {380, 150});
     form.Note(KeyText("IDS_QM_UI_ULF_CHOSEN_ITERATION"));
-    AddUlfGrid(form, RowGrid(run), {480, 150});
+    AddUlfGrid(form, RowGrid(run), {380, 150});
     form.NextColumn();
-    form.Picture([&run] { return PictureOf(run); }).widget->setMinimumSize(520, 400);
+    form.Picture([&run] { return PictureOf(run); }).widget->setMinimumSize(420, 400);
     form.EndColumns();
 }
 
