@@ -48,26 +48,6 @@ EXIT_CODE SolveOpened(const T_ULF_OPTIONS& o, T_ULF_OPENED& in)
 }
 
 #ifdef QM_UI
-std::string FactorNote(const T_ULF_CASE& c, double factor)
-{
-    return FormatText("%s = %.6g%s", c.name.c_str(), factor, c.unknown ? "" : " (known)");
-}
-
-T_ULF_PICTURE PictureOf(CDBDoc& doc, const T_ULF_RESULT& r)
-{
-    T_ULF_PICTURE picture;
-    picture.title = "Unknown load factors: " + r.item.name;
-    picture.subtitle = std::string(r.exact ? "solved as equations" : "optimized") + ", " +
-                       doc.Data().Model().styp.title;
-    for (const T_ULF_RESULT_ROW& row : UlfResultRows(r))
-        picture.bars.push_back({UlfNameAt(row.name, row.place), UlfUnit(doc, row.name), row.value,
-                                row.upper, row.lower, row.active, !row.met,
-                                UlfScale(r, picture.bars.size())});
-    for (std::size_t i = 0; i < r.cases.size(); ++i)
-        picture.notes.push_back(FactorNote(r.cases[i], r.factors[i]));
-    return picture;
-}
-
 /// Displacements of the known cases alone, and of all with the factors found.
 EXIT_CODE DrawBeforeAfter(CDBDoc& doc, const T_ULF_RESULT& r, const std::string& path)
 {
@@ -93,7 +73,7 @@ EXIT_CODE DrawBeforeAfter(CDBDoc& doc, const T_ULF_RESULT& r, const std::string&
 EXIT_CODE DrawPictures(CDBDoc& doc, const T_ULF_RESULT& r, const T_ULF_OPTIONS& o)
 {
 #ifdef QM_UI
-    EXIT_CODE code = WritePicture(UlfPlot(PictureOf(doc, r)), o.plot);
+    EXIT_CODE code = WritePicture(UlfPlot(UlfPictureOf({doc, r})), o.plot);
     if (code == EXIT_CODE::Done && !o.shapePlot.empty())
         code = DrawBeforeAfter(doc, r, o.shapePlot);
     return code;

@@ -74,13 +74,6 @@ std::string List(const std::vector<T>& items, const F& print)
     return text + (items.empty() ? "]" : "\n ]");
 }
 
-/// For tables: what rounding has left of a zero is shown as 0.
-double Shown(double value, double scale)
-{
-    constexpr double kZero = 1e-12; // of the row's scale
-    return std::fabs(value) <= kZero * scale ? 0.0 : value + 0.0;
-}
-
 template <class ROWS, class F>
 int Widest(const ROWS& rows, int least, const F& text)
 {
@@ -225,18 +218,8 @@ std::string UlfTables(const T_ULF_RESULT& r)
         const double scale = UlfScale(r, i);
         const char* const state = !row.met ? "not met" : row.active ? "active" : "-";
         text += FormatText("%-*s %15.7g %15s %15s %13.3g  %s\n", width, nameOf(row).c_str(),
-                           Shown(row.value, scale), Short(row.lower).c_str(),
-                           Short(row.upper).c_str(), Shown(row.residual, scale), state);
+                           UlfShown(row.value, scale), Short(row.lower).c_str(),
+                           Short(row.upper).c_str(), UlfShown(row.residual, scale), state);
     }
     return text + FormatText("\nobjective %.9g\n", UlfObjective(r));
-}
-
-std::string UlfUnit(CDBDoc& doc, const std::string& constraint)
-{
-    T_ULFC_D record;
-    if (!doc.Attr().GetUlfc_(constraint, record)) return {};
-    const T_UNITS units = doc.Unit().Units();
-    if (record.type == ULFC_TYPE::Displacement)
-        return record.component < 3 ? LengthName(units) : std::string();
-    return record.component < 3 ? ForceName(units) : MomentName(units);
 }

@@ -56,5 +56,3 @@ std::string UlfJson(const T_ULF_OUTCOME& outcome, const std::optional<T_ULF_RESU
 std::string ExplainJson(const T_ULF_EXPLAINED& explained);
 /// Tables of the factors and of the constraints.
 std::string UlfTables(const T_ULF_RESULT& result);
-/// Unit of a constraint's value; empty for a rotation.
-std::string UlfUnit(CDBDoc& doc, const std::string& constraint);

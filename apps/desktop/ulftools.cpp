@@ -1,18 +1,91 @@
 #include "ulftools.h"
 
-void RegisterUlfViews(CViewFactory&) {}
+#include "qm_rps/loadcombinationdlg.h"
+#include "qm_rps/ulfiterationrundlg.h"
+#include "qm_rps/unknownloadfactorconstraintdlg.h"
+#include "qm_rps/unknownloadfactordlg.h"
+#include "qm_rps/unknownloadfactoritemdlg.h"
+#include "qm_rps/unknownloadfactoriteranaldlg.h"
+#include "qm_rps/unknownstageitemdlg.h"
+#include "qm_rps/unknowntabletabgrid1.h"
+#include "qm_ui/loadcombinationview.h"
+#include "qm_ui/ulfconstraintview.h"
+#include "qm_ui/ulfitemview.h"
+#include "qm_ui/ulfiterationview.h"
+#include "qm_ui/ulfresultview.h"
 
-T_COMMANDS UlfCommands(T_DESKTOP&)
+void RegisterUlfViews(CViewFactory& factory)
 {
-    return {};
+    const T_ULF_HOOKS hooks{RunWithProgress, [](QWidget* parent) {
+                                return AskFileName(parent, true,
+                                                   UlfText("IDS_QM_UI_ULF_SHEET_TITLE"),
+                                                   UlfText("IDS_QM_UI_ULF_SHEET_FILTER"));
+                            }};
+    RegisterUlfItemViews(factory, hooks);
+    RegisterUlfConstraintViews(factory);
+    RegisterUlfResultViews(factory, hooks);
+    RegisterUlfIterationViews(factory);
+    RegisterLoadCombinationView(factory);
 }
 
-bool OpenUlfRecord(T_DESKTOP&, EXPLORER_TABLE, int)
+namespace {
+
+/// Runs a dialog over the main window.
+void Show(T_DESKTOP& desktop, zql::frx::MDialog& dialog)
 {
-    return false;
+    dialog.SetView(&desktop.view);
+    (void)dialog.DoModal();
+    desktop.changed();
 }
 
-std::vector<T_WINDOW_EXAMPLE> UlfWindowExamples()
+template <class DIALOG, class... ARGS>
+void Show(T_DESKTOP& desktop, ARGS&&... args)
 {
-    return {};
+    DIALOG dialog(desktop.doc, std::forward<ARGS>(args)...);
+    Show(desktop, dialog);
+}
+
+void ShowSettings(T_DESKTOP& desktop)
+{
+    auto* settings = CUnknownLoadFactorIterAnal::Of(desktop.doc.DynModules());
+    if (!settings) return;
+    CUnknownLoadFactorIterAnalDlg dialog(*settings);
+    Show(desktop, dialog);
+}
+
+} // namespace
+
+T_COMMANDS UlfCommands(T_DESKTOP& d)
+{
+    constexpr const char* kMenu = "IDS_QM_UI_MENU_ULF";
+    const auto hasItems = [&d] { return !d.doc.Data().Model().ulfStageItems.empty(); };
+    return {{kMenu, "IDS_QM_UI_ULF_ITEMS", "Ctrl+L", [&d] { Show<CUnknownLoadFactorDlg>(d); }},
+            {kMenu, "IDS_QM_UI_ULF_CONSTRAINTS", "Ctrl+Shift+L",
+             [&d] { Show<CUnknownTableTabGrid1>(d); }},
+            {kMenu},
+            {kMenu, "IDS_QM_UI_ULF_ITER_SETTINGS", "", [&d] { ShowSettings(d); }},
+            {kMenu, "IDS_QM_UI_ULF_ITERATE", "", [&d] { Show<CUlfIterationRunDlg>(d); }, hasItems}};
+}
+
+bool OpenUlfRecord(T_DESKTOP& desktop, EXPLORER_TABLE table, int key)
+{
+    switch (table) {
+    case EXPLORER_TABLE::UlfConstraints:
+        Show<CUnknownLoadFactorConstraintDlg>(desktop, key);
+        return true;
+    case EXPLORER_TABLE::UlfItems:
+        Show<CUnknownLoadFactorItemDlg>(desktop, key);
+        return true;
+    case EXPLORER_TABLE::UlfStageItems: {
+        CUlfStageResults results(desktop.doc);
+        CUnknownStageItemDlg dialog(desktop.doc, results, key);
+        Show(desktop, dialog);
+        return true;
+    }
+    case EXPLORER_TABLE::Combinations:
+        Show<CLoadCombinationDlg>(desktop, key);
+        return true;
+    default:
+        return false;
+    }
 }

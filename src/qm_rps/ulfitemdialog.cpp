@@ -3,6 +3,9 @@
 #include "qm_base/messagehistory.h"
 #include "qm_base/msgfunction.h"
 #include "qm_rps/ulfchecks.h"
+#include "qm_rps/ulfexplanationdlg.h"
+#include "qm_rps/ulfstageplace.h"
+#include "qm_rps/unknownloadfactorresultdlg.h"
 
 #include <algorithm>
 
@@ -17,9 +20,9 @@ void WriteHistory(const char* key)
 
 } // namespace
 
-void CUlfItemDialog::SetChecks(const T_MODEL& model, const std::vector<std::string>& names,
-                               bool itemsFirst)
+void CUlfItemDialog::SetChecks(const std::vector<std::string>& names, bool itemsFirst)
 {
+    const T_MODEL& model = m_doc.Data().Model();
     m_checks.clear();
     m_missing.clear();
     for (const std::string& name : names) {
@@ -43,14 +46,70 @@ std::vector<std::string> CUlfItemDialog::CheckedNames() const
     return names;
 }
 
-int CUlfItemDialog::ReadConstraints(CDBDoc& doc, T_ULF_RUN& run)
+int CUlfItemDialog::ReadConstraints(T_ULF_RUN& run) const
 {
     for (const std::string& name : run.item.constraints) {
         T_ULFC_D constraint;
-        if (!doc.Attr().GetUlfc_(name, constraint)) return 0;
+        if (!m_doc.Attr().GetUlfc_(name, constraint)) return 0;
         run.constraints.push_back(std::move(constraint));
     }
     return 1;
+}
+
+std::string CUlfItemDialog::CheckText(std::size_t check) const
+{
+    T_ULFC_D constraint;
+    return check < m_checks.size() && m_doc.Attr().GetUlfc_(m_checks[check].name, constraint)
+               ? UlfConstraintText(m_doc.Data(), constraint)
+               : std::string();
+}
+
+int CUlfItemDialog::OnAnalyse(const ULF_PROGRESS& progress, std::string& error)
+{
+    error.clear();
+    if (!Findings().empty()) return 1;
+    std::optional<T_ANALYSIS_OPTIONS> missing = MissingResults();
+    T_ANALYSIS_ERROR fault;
+    if (!missing || RunWatchedAnalysis(m_doc, std::move(*missing), progress, fault)) return 1;
+    if (fault.fault != ANALYSIS_FAULT::Cancelled) error = fault.text;
+    return 0;
+}
+
+int CUlfItemDialog::OnSolve()
+{
+    if (!OnCalculate()) return 0;
+    CUnknownLoadFactorResultDlg dialog(m_doc, *m_result);
+    dialog.SetView(View());
+    (void)dialog.DoModal();
+    return 1;
+}
+
+int CUlfItemDialog::OnExplain(const std::function<bool(int, int)>& progress)
+{
+    m_explained.reset();
+    const std::size_t before = Messages().size();
+    zql::frx::IDialogView* const view = View();
+    SetView(nullptr); // the message of a calculation without a solution is told with the rest
+    (void)OnCalculate();
+    SetView(view);
+    const bool told = Messages().size() > before;
+    m_explainedMessage = told ? Messages().back().text : std::string();
+    T_ULF_EXPLAINED explained;
+    if (!m_run || !ExplainUlf(*m_run, m_doc.Unit().Units(), explained, progress)) return 0;
+    m_explained = std::move(explained);
+    return 1;
+}
+
+void CUlfItemDialog::ShowExplanation()
+{
+    if (!m_explained) {
+        if (!m_explainedMessage.empty())
+            ShowMessage("IDS_RPS_Unknown_Load_Factor_Item_has_an_error", m_explainedMessage);
+        return;
+    }
+    CUlfExplanationDlg dialog(m_name, m_explainedMessage, *m_explained);
+    dialog.SetView(View());
+    (void)dialog.DoModal();
 }
 
 void CUlfItemDialog::Forget()

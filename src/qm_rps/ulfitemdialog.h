@@ -2,9 +2,9 @@
 // construction stages: name, objective, sign, constraints, and what a calculation leaves.
 #pragma once
 
-#include "qm_db/dbdoc.h"
 #include "qm_rps/hingedialog.h"
-#include "qm_rps/ulfresult.h"
+#include "qm_rps/ulfanalysis.h"
+#include "qm_rps/ulfexplain.h"
 
 class CUlfItemDialog : public CHingeDialog {
 public:
@@ -20,31 +20,53 @@ public:
         bool operator==(const T_CHECK&) const = default;
     };
 
+    /// The document must outlive the dialog.
+    explicit CUlfItemDialog(CDBDoc& doc) : m_doc(doc) {}
+
     std::string m_name;
     int m_objective = 0; // index of kObjectiveKeys
     int m_sign = 1;      // index of kSignKeys
     bool m_solveByEquations = false;
     std::vector<T_CHECK> m_checks; // all constraints of the model
+    /// The constraint of a check in words, with its place.
+    std::string CheckText(std::size_t check) const;
+
+    /// Analyses what the calculation reads and the document has no current results of; an item
+    /// with findings is left to its calculation, which refuses it. 1 done; 0 cancelled, or `error`
+    /// says why not.
+    [[nodiscard]] int OnAnalyse(const ULF_PROGRESS& progress, std::string& error);
 
     /// The calculation. 1: Result() has the factors; constraints that equations could not meet to
     /// 1e-6 are named in a message. 0: refused or not solved, with a message, and no result kept.
     /// Either outcome goes to the message history.
     [[nodiscard]] virtual int OnCalculate() = 0;
+    /// Calculates and shows the window of the result. 1 solved.
+    [[nodiscard]] int OnSolve();
+    /// Calculates and explains the outcome; progress as of ExplainUlf. 1 ShowExplanation can show
+    /// it; 0 the calculation was refused before it had anything to explain, with its message.
+    [[nodiscard]] int OnExplain(const std::function<bool(int, int)>& progress);
+    /// Shows the window of the latest explanation, or the message of the refused calculation.
+    void ShowExplanation();
     const std::optional<T_ULF_RESULT>& Result() const { return m_result; }
     /// Of the latest calculation that reached the optimizer, for its explanation.
     const std::optional<T_ULF_RUN>& LastRun() const { return m_run; }
 
 protected:
     /// Flags of the grids: "1" and "0".
+    CDBDoc& m_doc;
+
+    /// What to analyse for a calculation; empty: the document has current results of it all.
+    virtual std::optional<T_ANALYSIS_OPTIONS> MissingResults() const = 0;
+
     static std::string Flag(bool on) { return on ? "1" : "0"; }
 
     /// The constraints of the model in its order, or those of the item before the others, with
     /// these names checked.
-    void SetChecks(const T_MODEL& model, const std::vector<std::string>& names, bool itemsFirst);
+    void SetChecks(const std::vector<std::string>& names, bool itemsFirst);
     /// Names that are checked, then those that the model lacks.
     std::vector<std::string> CheckedNames() const;
     /// The constraints of run.item. 1 done; 0 one of them is gone.
-    [[nodiscard]] static int ReadConstraints(CDBDoc& doc, T_ULF_RUN& run);
+    [[nodiscard]] int ReadConstraints(T_ULF_RUN& run) const;
 
     /// Forgets the latest calculation.
     void Forget();
@@ -59,4 +81,6 @@ private:
     std::vector<std::string> m_missing; // constraints that the item names and the model lacks
     std::optional<T_ULF_RUN> m_run;
     std::optional<T_ULF_RESULT> m_result;
+    std::optional<T_ULF_EXPLAINED> m_explained;
+    std::string m_explainedMessage; // of the calculation that is explained
 };

@@ -21,6 +21,7 @@ int CUlfIteration::Solve(int iteration)
     if (!m_host.Solve(step.rows)) return Stop(ULF_ITER_END::NotSolved);
     step.tolerance = UlfIterTolerance(step.rows);
     m_history.push_back(std::move(step));
+    if (m_solved) m_solved();
     return 1;
 }
 
@@ -43,10 +44,13 @@ int CUlfIteration::WriteFirst()
 
 int CUlfIteration::AskForMore()
 {
+    if (!m_asks) return 1;
     CUlfIterationResultDlg dialog(m_history.back());
     dialog.SetView(View());
     const bool accepted = View() && View()->RunModal(dialog) != 0;
-    return accepted && dialog.m_iterate ? 1 : Stop(ULF_ITER_END::Declined);
+    if (!accepted || !dialog.m_iterate) return Stop(ULF_ITER_END::Declined);
+    m_asks = !dialog.m_dontAsk;
+    return 1;
 }
 
 int CUlfIteration::Scale()
@@ -95,6 +99,7 @@ int CUlfIteration::Iterate(int iteration)
 int CUlfIteration::Run()
 {
     m_history.clear();
+    m_asks = true;
     m_model = m_host.ModelPath();
     m_report = UlfIterReportPath(m_model);
     // The dialog comes before the report: who declines here leaves no report.

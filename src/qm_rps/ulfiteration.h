@@ -41,6 +41,9 @@ public:
     /// iteration. Empty: goes on.
     std::function<bool(int done, int required)> m_progress;
 
+    /// Told after each solution. Empty: nobody.
+    std::function<void()> m_solved;
+
     /// 1: converged, or the required number is done, or the person wanted no more; 0: cancelled or
     /// failed. End() says which.
     [[nodiscard]] int Run();
@@ -63,6 +66,7 @@ private:
     IUlfIterationHost& m_host;
     T_ULF_ITER_SETTINGS m_settings;
     std::vector<T_ULF_ITER_STEP> m_history;
+    bool m_asks = true;  // the result dialog comes before each iteration
     std::string m_model; // path at the start: copies are numbered from it
     std::string m_report;
     ULF_ITER_END m_end = ULF_ITER_END::Declined;

@@ -61,6 +61,12 @@ double UlfScale(const T_ULF_RESULT& r, std::size_t i)
     return std::max({sum, std::fabs(c.upper.value_or(0.0)), std::fabs(c.lower.value_or(0.0))});
 }
 
+double UlfShown(double value, double scale)
+{
+    constexpr double kZero = 1e-12; // of the row's scale
+    return std::fabs(value) <= kZero * scale ? 0.0 : value + 0.0;
+}
+
 std::vector<T_ULF_RESULT_ROW> UlfResultRows(const T_ULF_RESULT& r)
 {
     std::vector<T_ULF_RESULT_ROW> rows;

@@ -66,6 +66,9 @@ std::string UlfNameAt(const std::string& name, const std::string& place);
 /// What is small in the row of constraint i: its scale.
 double UlfScale(const T_ULF_RESULT& result, std::size_t constraint);
 
+/// For tables: what rounding has left of a zero is shown as 0.
+double UlfShown(double value, double scale);
+
 /// One row per user constraint. A row's scale: the largest of its bounds and the sum of the
 /// absolute contributions of the cases.
 std::vector<T_ULF_RESULT_ROW> UlfResultRows(const T_ULF_RESULT& result);

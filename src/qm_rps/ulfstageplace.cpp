@@ -1,5 +1,8 @@
 #include "qm_rps/ulfstageplace.h"
 
+#include "qm_rps/ulfresult.h"
+#include "qm_rps/ulftexts.h"
+
 #include <algorithm>
 
 namespace {
@@ -45,6 +48,21 @@ std::string UlfStageRowText(const CDataCtrl& data, const T_ULSI_ROW& row)
     if (const auto it = cases.find(row.loadCase); it != cases.end())
         text += (text.empty() ? "" : " ") + it->second.name;
     return text;
+}
+
+std::vector<std::pair<int, int>> UlfPlaces(const T_MODEL& model)
+{
+    std::vector<std::pair<int, int>> places;
+    for (const auto& [key, stage] : model.stages)
+        for (int step = kStageFirstStep; step <= std::min(stage.steps, kStageStepsMost); ++step)
+            places.emplace_back(key, step > kStageFirstStep && step == stage.steps ? kStageLastStep
+                                                                                   : step);
+    return places;
+}
+
+std::string UlfConstraintText(const CDataCtrl& data, const T_ULFC_D& c)
+{
+    return UlfNameAt(UlfDescription(c), UlfPlaceText(data, c.stage, c.step));
 }
 
 std::vector<int> LoadsActingAt(const T_MODEL& model, int stage, int step)

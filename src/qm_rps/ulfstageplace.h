@@ -20,6 +20,12 @@ std::string UlfPlaceText(const CDataCtrl& data, int stage, int step);
 /// Place and load case of a row, "S1/First Step T"; what is gone is left out.
 std::string UlfStageRowText(const CDataCtrl& data, const T_ULSI_ROW& row);
 
+/// Every stage and step of the model in their order; the final step of a stage with several is
+/// kStageLastStep.
+std::vector<std::pair<int, int>> UlfPlaces(const T_MODEL& model);
+/// A constraint in words, with the stage and step where it is read, if any.
+std::string UlfConstraintText(const CDataCtrl& data, const T_ULFC_D& constraint);
+
 /// Load cases that the stage brings at this step or before and has not taken away by then, in the
 /// stage's order.
 std::vector<int> LoadsActingAt(const T_MODEL& model, int stage, int step);

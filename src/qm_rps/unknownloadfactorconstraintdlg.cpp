@@ -1,9 +1,12 @@
 #include "qm_rps/unknownloadfactorconstraintdlg.h"
 
+#include "qm_base/msgfunction.h"
 #include "qm_rps/ulfchecks.h"
+#include "qm_rps/ulfstageplace.h"
 #include "qm_rps/ulftexts.h"
 
 #include <algorithm>
+#include <tuple>
 
 namespace {
 
@@ -53,6 +56,70 @@ std::vector<std::string> CUnknownLoadFactorConstraintDlg::ComponentTexts() const
     for (int i = 0; i < count; ++i)
         texts.push_back(UlfComponentText(m_constraint.type, i));
     return texts;
+}
+
+void CUnknownLoadFactorConstraintDlg::OnSelChangeType(int type)
+{
+    m_constraint.type = static_cast<ULFC_TYPE>(type);
+    const int count = static_cast<int>(ComponentTexts().size());
+    if (m_constraint.component >= count) m_constraint.component = 0;
+}
+
+CUnknownLoadFactorConstraintDlg::RELATION CUnknownLoadFactorConstraintDlg::Relation() const
+{
+    if (m_constraint.inequality) return Bounds;
+    return m_constraint.compareWithValue ? EqualsValue : EqualsOther;
+}
+
+void CUnknownLoadFactorConstraintDlg::OnSelChangeRelation(int relation)
+{
+    m_constraint.inequality = relation == Bounds;
+    m_constraint.compareWithValue = relation != EqualsOther;
+}
+
+std::vector<std::string> CUnknownLoadFactorConstraintDlg::PositionTexts()
+{
+    std::vector<std::string> texts;
+    for (int i = 0; !UlfPositionText(i).empty(); ++i)
+        texts.push_back(UlfPositionText(i));
+    return texts;
+}
+
+std::string CUnknownLoadFactorConstraintDlg::UnitText() const
+{
+    return UlfUnitText(m_constraint.type, m_constraint.component, m_doc.Unit().Units());
+}
+
+std::vector<std::string> CUnknownLoadFactorConstraintDlg::PlaceTexts() const
+{
+    std::vector<std::string> texts{zql::lib::MMSGFunction::GetValue("IDS_QM_UI_ULF_NO_PLACE")};
+    for (const auto& [stage, step] : UlfPlaces(m_doc.Data().Model()))
+        texts.push_back(UlfPlaceText(m_doc.Data(), stage, step));
+    return texts;
+}
+
+int CUnknownLoadFactorConstraintDlg::PlaceIndex() const
+{
+    if (m_constraint.stage == 0) return 0;
+    const T_MODEL& model = m_doc.Data().Model();
+    const auto places = UlfPlaces(model);
+    const auto same = [&](const std::pair<int, int>& place) {
+        return place.first == m_constraint.stage &&
+               UlfStepNumber(model, place.first, place.second) ==
+                   UlfStepNumber(model, m_constraint.stage, m_constraint.step);
+    };
+    const auto it = std::ranges::find_if(places, same);
+    return it == places.end() ? -1 : static_cast<int>(it - places.begin()) + 1;
+}
+
+void CUnknownLoadFactorConstraintDlg::OnSelChangePlace(int index)
+{
+    const auto places = UlfPlaces(m_doc.Data().Model());
+    m_constraint.stage = 0;
+    m_constraint.step = kStageLastStep;
+    if (index >= 1 && index <= std::ssize(places))
+        std::tie(m_constraint.stage, m_constraint.step) =
+            places[static_cast<std::size_t>(index - 1)];
 }
 
 std::vector<T_FINDING> CUnknownLoadFactorConstraintDlg::Findings() const

@@ -27,6 +27,23 @@ public:
     /// Texts of the components that the chosen type offers, by index.
     std::vector<std::string> ComponentTexts() const;
 
+    /// Another type: a component that it does not offer becomes the first one.
+    void OnSelChangeType(int type);
+    /// What the quantity is held to: a value, the same quantity elsewhere, or bounds.
+    enum RELATION { EqualsValue, EqualsOther, Bounds };
+    static constexpr std::array<const char*, 3> kRelationKeys{
+        "IDS_QM_UI_ULF_EQUALS_VALUE", "IDS_QM_UI_ULF_EQUALS_OTHER", "IDS_QM_UI_ULF_BOUNDS"};
+    RELATION Relation() const;
+    void OnSelChangeRelation(int relation);
+    static std::vector<std::string> PositionTexts();
+    /// Unit of value and bounds.
+    std::string UnitText() const;
+
+    /// Construction stages: the first choice is none (a result of static load cases).
+    std::vector<std::string> PlaceTexts() const;
+    int PlaceIndex() const; // -1: a place that the model does not have
+    void OnSelChangePlace(int index);
+
     /// Rules that are not kept, in the order of the check; CheckData shows the first.
     std::vector<T_FINDING> Findings() const override;
     /// Checks, then stores the constraint as one edit that can be undone; items that name it take

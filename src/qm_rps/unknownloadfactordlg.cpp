@@ -26,6 +26,18 @@ int CUnknownLoadFactorDlg::CheckData()
     return 0;
 }
 
+std::unique_ptr<CUlfItemDialog> CUnknownLoadFactorDlg::ChosenItem()
+{
+    if (!CheckData()) return nullptr;
+    std::unique_ptr<CUlfItemDialog> item;
+    if (m_stage)
+        item = std::make_unique<CUnknownStageItemDlg>(m_doc, m_results, m_selected);
+    else
+        item = std::make_unique<CUnknownLoadFactorItemDlg>(m_doc, m_selected);
+    item->SetView(View());
+    return item;
+}
+
 template <class DIALOG>
 int CUnknownLoadFactorDlg::Show(DIALOG&& dialog, bool stage)
 {

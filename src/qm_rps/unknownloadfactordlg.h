@@ -4,7 +4,10 @@
 
 #include "qm_base/mdialog.h"
 #include "qm_db/dbdoc.h"
+#include "qm_rps/ulfitemdialog.h"
 #include "qm_rps/ulfstageresults.h"
+
+#include <memory>
 
 class CUnknownLoadFactorDlg : public zql::frx::MDialog {
 public:
@@ -31,6 +34,9 @@ public:
     [[nodiscard]] int OnModify();
     /// Deletes the chosen item; can be undone. 0 with a message: no such item.
     [[nodiscard]] int OnDelete();
+    /// The dialog of the chosen item, with this one's view, for its calculation. Null with a
+    /// message: no such item. It must not outlive this object.
+    std::unique_ptr<CUlfItemDialog> ChosenItem();
     /// The chosen item exists; 0 with a message otherwise.
     int CheckData() override;
 

@@ -6,7 +6,7 @@
 #include <algorithm>
 
 CUnknownLoadFactorItemDlg::CUnknownLoadFactorItemDlg(CDBDoc& doc, int key)
-    : m_doc(doc), m_key(key), m_source(doc),
+    : CUlfItemDialog(doc), m_key(key), m_source(doc),
       m_cache(m_source, [this] { return m_source.Revision(); })
 {
     T_ULFI_D item;
@@ -37,7 +37,7 @@ void CUnknownLoadFactorItemDlg::Data2Dlg(const T_ULFI_D& item)
     m_strangers = item.unknowns;
     OnSelChangeCombination(item.combination);
 
-    SetChecks(m_doc.Data().Model(), item.constraints, false);
+    SetChecks(item.constraints, false);
 }
 
 void CUnknownLoadFactorItemDlg::OnSelChangeCombination(int key)
@@ -135,11 +135,42 @@ int CUnknownLoadFactorItemDlg::OnOK()
     return 1;
 }
 
+std::optional<T_ANALYSIS_OPTIONS> CUnknownLoadFactorItemDlg::MissingResults() const
+{
+    T_ANALYSIS_OPTIONS options;
+    options.allCases = options.stages = false;
+    for (const T_ULF_CASE& c : m_cases)
+        if (!m_doc.Post().CheckStaticResult(c.key)) options.cases.push_back(c.key);
+    return options.cases.empty() ? std::nullopt : std::optional(options);
+}
+
+std::vector<std::string> CUnknownLoadFactorItemDlg::CombinationTexts() const
+{
+    std::vector<std::string> names;
+    for (const auto& entry : m_doc.Data().Model().combinations)
+        names.push_back(entry.second.name);
+    return names;
+}
+
+int CUnknownLoadFactorItemDlg::CombinationIndex() const
+{
+    const std::vector<int> keys = m_doc.Attr().GetLcomKeys();
+    const auto it = std::ranges::find(keys, m_combination);
+    return it == keys.end() ? -1 : static_cast<int>(it - keys.begin());
+}
+
+void CUnknownLoadFactorItemDlg::OnSelChangeCombinationIndex(int index)
+{
+    const std::vector<int> keys = m_doc.Attr().GetLcomKeys();
+    if (index >= 0 && index < static_cast<int>(keys.size()))
+        OnSelChangeCombination(keys[static_cast<std::size_t>(index)]);
+}
+
 int CUnknownLoadFactorItemDlg::ReadRun(T_ULF_RUN& run) const
 {
     run.item = Record();
     run.cases = m_cases;
-    if (!ReadConstraints(m_doc, run)) return 0;
+    if (!ReadConstraints(run)) return 0;
     run.formed = FormUlfProblem(run.item, run.cases, run.constraints);
     return 1;
 }

@@ -27,6 +27,10 @@ public:
     int Combination() const { return m_combination; }
     /// Another combination: its load cases; flags and weights of cases that both have stay.
     void OnSelChangeCombination(int key);
+    /// The combinations of the model as a list: names, the chosen one (-1: it is gone), a choice.
+    std::vector<std::string> CombinationTexts() const;
+    int CombinationIndex() const;
+    void OnSelChangeCombinationIndex(int index);
 
     const std::vector<T_ULF_CASE>& Cases() const { return m_cases; }
     /// Text of a cell: factors as "%.3f", weights as "%.6f".
@@ -46,10 +50,10 @@ public:
     bool m_dump = false; // debug: write the problem handed to the solver beside the model file
 
 private:
+    std::optional<T_ANALYSIS_OPTIONS> MissingResults() const override;
     std::optional<T_LCOM_D> Normalised(int combination) const;
     int ReadRun(T_ULF_RUN& run) const;
 
-    CDBDoc& m_doc;
     int m_key = 0;
     int m_combination = 0;
     std::vector<T_ULF_CASE> m_cases;

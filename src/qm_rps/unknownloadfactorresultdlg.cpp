@@ -2,23 +2,90 @@
 
 #include "qm_base/messagehistory.h"
 #include "qm_base/msgfunction.h"
+#include "qm_base/textformat.h"
 #include "qm_rps/ulfcombination.h"
+#include "qm_rps/ulftexts.h"
+
+#include <filesystem>
 
 using zql::lib::MMSGFunction;
 
 namespace {
 
-int Refuse(const char* key, const std::string& name = {})
+std::string NumberText(const std::optional<double>& value)
 {
-    GSaveHistoryFormatNF("%s", MMSGFunction::Format(key, {name}).c_str());
-    return 0;
+    return value ? FormatText("%.9g", *value + 0.0) : std::string();
 }
 
 } // namespace
 
+int CUnknownLoadFactorResultDlg::Refuse(const char* key, const std::string& name)
+{
+    m_outcome = MMSGFunction::Format(key, {name});
+    GSaveHistoryFormatNF("%s", m_outcome.c_str());
+    return 0;
+}
+
 CUnknownLoadFactorResultDlg::CUnknownLoadFactorResultDlg(CDBDoc& doc, T_ULF_RESULT result)
     : m_doc(doc), m_result(std::move(result))
 {
+    m_sheet.fileName = std::filesystem::path(doc.Path()).filename().string();
+}
+
+const T_ULF_RESULT_ROW& CUnknownLoadFactorResultDlg::RowAt(std::size_t constraint) const
+{
+    if (m_rows.empty()) m_rows = UlfResultRows(m_result);
+    return m_rows.at(constraint);
+}
+
+CUnknownLoadFactorResultDlg::STATE CUnknownLoadFactorResultDlg::StateOf(std::size_t i) const
+{
+    const T_ULF_RESULT_ROW& row = RowAt(i);
+    return !row.met ? STATE::NotMet : row.active ? STATE::Active : STATE::Within;
+}
+
+std::string CUnknownLoadFactorResultDlg::UnitOf(std::size_t i) const
+{
+    T_ULFC_D c;
+    if (!m_doc.Attr().GetUlfc_(RowAt(i).name, c)) return {};
+    return UlfUnitText(c.type, c.component, m_doc.Unit().Units());
+}
+
+std::string CUnknownLoadFactorResultDlg::ModelTitle() const
+{
+    return m_doc.Data().Model().styp.title;
+}
+
+std::string CUnknownLoadFactorResultDlg::FactorText(std::size_t row, std::size_t column) const
+{
+    const T_ULF_CASE& c = m_result.cases.at(row);
+    if (column == 0) return c.name;
+    if (column == 1) return NumberText(m_result.factors.at(row));
+    return MMSGFunction::GetValue(c.unknown ? "IDS_RPS_GXGRID_Unknown" : "IDS_RPS_GXGRID_known");
+}
+
+std::string CUnknownLoadFactorResultDlg::ConstraintText(std::size_t i, std::size_t column) const
+{
+    const T_ULF_RESULT_ROW& row = RowAt(i);
+    const double scale = UlfScale(m_result, i);
+    switch (column) {
+    case 0:
+        return UlfNameAt(row.name, row.place);
+    case 1:
+        return NumberText(UlfShown(row.value, scale));
+    case 2:
+        return NumberText(row.upper);
+    case 3:
+        return NumberText(row.lower);
+    case 4:
+        return NumberText(UlfShown(row.residual, scale));
+    case 5:
+        return MMSGFunction::GetValue(kStateKeys[static_cast<std::size_t>(StateOf(i))]);
+    case 6:
+        return UnitOf(i);
+    default:
+        return row.description;
+    }
 }
 
 int CUnknownLoadFactorResultDlg::OnExport(const std::string& path,
@@ -54,6 +121,10 @@ int CUnknownLoadFactorResultDlg::OnMakeCombination()
     std::map<int, double> factors;
     for (std::size_t i = 0; i < m_result.cases.size(); ++i)
         factors[m_result.cases[i].key] = m_result.factors[i];
-    return AddUlfCombinations(m_doc, m_combinationName,
-                              PlanUlfCombinations(m_combinationName, flat, factors));
+    const int made = AddUlfCombinations(m_doc, m_combinationName,
+                                        PlanUlfCombinations(m_combinationName, flat, factors));
+    m_outcome = MMSGFunction::Format(made ? "IDS_RPS_UNKNOWN_LOAD_LCOM_SUCCESS"
+                                          : "IDS_RPS_UNKNOWN_LOAD_LCOM_FAIL",
+                                     {m_combinationName});
+    return made;
 }

@@ -32,6 +32,24 @@ public:
     }
     std::vector<T_ULF_RESULT_ROW> Rows() const { return UlfResultRows(m_result); }
 
+    enum class STATE { Within, Active, NotMet };
+    static constexpr std::array<const char*, 3> kStateKeys{
+        "IDS_QM_UI_ULF_WITHIN", "IDS_QM_UI_ULF_AT_BOUND", "IDS_QM_UI_ULF_NOT_MET"};
+    /// Texts of the tables: numbers with nine digits, what rounding has left of a zero as 0.
+    /// Columns of the factors: name, factor, whether it is unknown.
+    std::string FactorText(std::size_t row, std::size_t column) const;
+    /// Columns: name with its place, value, upper and lower bound, by how much they are missed,
+    /// state (kConstraintHeads); then the unit, and the constraint in words.
+    std::string ConstraintText(std::size_t row, std::size_t column) const;
+    STATE StateOf(std::size_t constraint) const;
+    /// Unit of a constraint's value.
+    std::string UnitOf(std::size_t constraint) const;
+    /// Title of the model.
+    std::string ModelTitle() const;
+
+    /// For OnExport(path); the file name is that of the model. The date is the caller's to set.
+    T_ULF_SHEET_SETTINGS m_sheet;
+    [[nodiscard]] int OnExport(const std::string& path) { return OnExport(path, m_sheet); }
     /// Writes the spreadsheet. 1 done; 0 with a message: too many constraints, or the file can't
     /// be written (then it is as it was).
     [[nodiscard]] int OnExport(const std::string& path, const T_ULF_SHEET_SETTINGS& settings);
@@ -43,8 +61,15 @@ public:
     /// Makes the combination, see AddUlfCombinations. 0: refused (the dialog stays open), or not
     /// all of them could be added; the message history says what happened.
     [[nodiscard]] int OnMakeCombination();
+    /// What the latest making of a combination has come to, in words; empty before it.
+    const std::string& Outcome() const { return m_outcome; }
 
 private:
+    const T_ULF_RESULT_ROW& RowAt(std::size_t constraint) const;
+    int Refuse(const char* key, const std::string& name = {});
+
     CDBDoc& m_doc;
     T_ULF_RESULT m_result;
+    mutable std::vector<T_ULF_RESULT_ROW> m_rows; // made for the first cell that is shown
+    std::string m_outcome;
 };

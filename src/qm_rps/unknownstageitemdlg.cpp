@@ -2,9 +2,11 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/ulfiterationrundlg.h"
 #include "qm_rps/ulfstageplace.h"
 
 #include <algorithm>
+#include <tuple>
 
 using zql::lib::MMSGFunction;
 
@@ -19,7 +21,7 @@ std::string CaseName(const T_MODEL& model, int key)
 } // namespace
 
 CUnknownStageItemDlg::CUnknownStageItemDlg(CDBDoc& doc, IUlfStageResults& results, int key)
-    : m_doc(doc), m_key(key), m_source(results)
+    : CUlfItemDialog(doc), m_key(key), m_source(results)
 {
     const auto& table = m_doc.Data().Model().ulfStageItems;
     const auto it = table.find(key);
@@ -35,7 +37,7 @@ void CUnknownStageItemDlg::Data2Dlg(const T_ULSI_D& item)
     m_solveByEquations = item.solveByEquations;
     m_rows = item.rows;
     // The item's own ones first, in its order, so that a calculation keeps that order.
-    SetChecks(m_doc.Data().Model(), item.constraints, true);
+    SetChecks(item.constraints, true);
 }
 
 T_ULSI_D CUnknownStageItemDlg::Record() const
@@ -77,6 +79,64 @@ std::string CUnknownStageItemDlg::CellText(std::size_t row, COLUMN column) const
     return group < kGroupKeys.size() ? MMSGFunction::GetValue(kGroupKeys[group]) : std::string();
 }
 
+std::vector<std::string> CUnknownStageItemDlg::Choices(COLUMN column) const
+{
+    const T_MODEL& model = m_doc.Data().Model();
+    std::vector<std::string> texts;
+    if (column == Stage)
+        for (const auto& [stage, step] : UlfPlaces(model))
+            texts.push_back(UlfPlaceText(m_doc.Data(), stage, step));
+    if (column == LoadCase)
+        for (const auto& entry : model.loadCases)
+            texts.push_back(entry.second.name);
+    if (column == Group)
+        for (const char* key : kGroupKeys)
+            texts.push_back(MMSGFunction::GetValue(key));
+    return texts;
+}
+
+int CUnknownStageItemDlg::SetChoice(T_ULSI_ROW& row, COLUMN column, const std::string& text) const
+{
+    const std::vector<std::string> texts = Choices(column);
+    const auto index = std::ranges::find(texts, text) - texts.begin();
+    if (index == std::ssize(texts)) return 0;
+    if (column == Stage)
+        std::tie(row.stage, row.step) =
+            UlfPlaces(m_doc.Data().Model())[static_cast<std::size_t>(index)];
+    if (column == LoadCase)
+        row.loadCase = std::next(m_doc.Data().Model().loadCases.begin(), index)->first;
+    if (column == Group) row.loadGroup = static_cast<int>(index);
+    return 1;
+}
+
+void CUnknownStageItemDlg::OnAddRow()
+{
+    const T_MODEL& model = m_doc.Data().Model();
+    T_ULSI_ROW row;
+    if (!m_rows.empty()) {
+        row.stage = m_rows.back().stage;
+        row.step = m_rows.back().step;
+        row.loadGroup = m_rows.back().loadGroup;
+    } else if (!model.stages.empty()) {
+        row.stage = model.stages.begin()->first;
+    }
+    const auto stands = [&](int loadCase) {
+        return std::ranges::any_of(m_rows, [&](const T_ULSI_ROW& r) {
+            return r.loadCase == loadCase && r.stage == row.stage && r.step == row.step;
+        });
+    };
+    for (const auto& entry : model.loadCases)
+        if (row.loadCase == 0 && !stands(entry.first)) row.loadCase = entry.first;
+    m_rows.push_back(row);
+}
+
+int CUnknownStageItemDlg::OnDeleteRow(std::size_t row)
+{
+    if (row >= m_rows.size()) return 0;
+    m_rows.erase(m_rows.begin() + static_cast<std::ptrdiff_t>(row));
+    return 1;
+}
+
 int CUnknownStageItemDlg::SetCell(std::size_t row, COLUMN column, const std::string& text)
 {
     if (row >= m_rows.size()) return 0;
@@ -86,6 +146,7 @@ int CUnknownStageItemDlg::SetCell(std::size_t row, COLUMN column, const std::str
         (column == Unknown ? r.unknown : r.pretension) = text == "1";
         return 1;
     }
+    if (column == Stage || column == LoadCase || column == Group) return SetChoice(r, column, text);
     const std::optional<double> number = ParseFinite(text);
     if ((column != Weight && column != Factor) || !number) return 0;
     // The shown text handed back keeps the digits that it does not show.
@@ -129,6 +190,13 @@ std::array<CUnknownStageItemDlg::T_SUMMARY, 3> CUnknownStageItemDlg::Summary() c
     return summary;
 }
 
+std::optional<T_ANALYSIS_OPTIONS> CUnknownStageItemDlg::MissingResults() const
+{
+    T_ANALYSIS_OPTIONS options;
+    options.allCases = false;
+    return m_doc.Post().CheckStagedResult() ? std::nullopt : std::optional(options);
+}
+
 int CUnknownStageItemDlg::ReadRun(T_ULF_RUN& run, T_ULSI_D& item)
 {
     item = Record();
@@ -140,7 +208,7 @@ int CUnknownStageItemDlg::ReadRun(T_ULF_RUN& run, T_ULSI_D& item)
     for (const T_ULSI_ROW& row : item.rows)
         run.cases.push_back({row.loadCase, UlfStageRowText(m_doc.Data(), row), row.factor,
                              row.unknown, row.weight});
-    if (!ReadConstraints(m_doc, run)) return 0;
+    if (!ReadConstraints(run)) return 0;
     for (const T_ULFC_D& c : run.constraints)
         run.places.push_back(c.stage ? UlfPlaceText(m_doc.Data(), c.stage, c.step) : std::string());
     return 1;
@@ -178,4 +246,12 @@ int CUnknownStageItemDlg::OnIterate(CUlfIteration& iteration)
     if (!CheckData()) return 0;
     iteration.SetView(View());
     return iteration.Run();
+}
+
+void CUnknownStageItemDlg::OnIterateWindow()
+{
+    if (!CheckData()) return;
+    CUlfIterationRunDlg run(m_doc, *this);
+    run.SetView(View());
+    (void)run.DoModal();
 }

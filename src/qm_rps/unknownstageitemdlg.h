@@ -40,9 +40,16 @@ public:
 
     /// Text of a cell: factors as "%.3f", weights as "%.6f", the stage as "S1/First Step".
     std::string CellText(std::size_t row, COLUMN column) const;
-    /// Takes an edited cell: unknown or pretension flag, factor or weight. 0: no such cell, or not
-    /// a finite number; the cell as it was.
+    /// Takes an edited cell: a text of Choices, unknown or pretension flag, factor or weight. 0: no
+    /// such cell, not a finite number or none of the choices; the cell as it was.
     [[nodiscard]] int SetCell(std::size_t row, COLUMN column, const std::string& text);
+    /// What the cells of stage and step, load case or load group may hold; empty of the others.
+    std::vector<std::string> Choices(COLUMN column) const;
+    /// Adds a row at the end: place and load group of the row before (else the first step of the
+    /// first stage), with the first load case that does not stand there yet.
+    void OnAddRow();
+    /// 0: no such row.
+    [[nodiscard]] int OnDeleteRow(std::size_t row);
 
     /// Rows of load group 0, of group 1, and all of them.
     std::array<T_SUMMARY, 3> Summary() const;
@@ -66,11 +73,15 @@ public:
     /// The calculation button: checks the input, then runs the iteration on the host. 1 see
     /// CUlfIteration::Run; 0 refused with a message, or as there.
     [[nodiscard]] int OnIterate(CUlfIteration& iteration);
+    /// Opens the window of the iterative analysis on the item as it is edited, once the input
+    /// passes its check.
+    void OnIterateWindow();
 
 private:
+    [[nodiscard]] int SetChoice(T_ULSI_ROW& row, COLUMN column, const std::string& text) const;
+    std::optional<T_ANALYSIS_OPTIONS> MissingResults() const override;
     [[nodiscard]] int ReadRun(T_ULF_RUN& run, T_ULSI_D& item);
 
-    CDBDoc& m_doc;
     int m_key = 0;
     CUlfStageResponse m_source;
 };

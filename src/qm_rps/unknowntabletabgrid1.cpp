@@ -1,9 +1,7 @@
 #include "qm_rps/unknowntabletabgrid1.h"
 
 #include "qm_base/msgfunction.h"
-#include "qm_rps/ulfresult.h"
 #include "qm_rps/ulfstageplace.h"
-#include "qm_rps/ulftexts.h"
 #include "qm_rps/unknownloadfactorconstraintdlg.h"
 
 #include <algorithm>
@@ -34,8 +32,7 @@ std::vector<CUnknownTableTabGrid1::T_ROW> CUnknownTableTabGrid1::Rows() const
     for (const int key : m_doc.Attr().GetUlfcKeys()) {
         T_ULFC_D c;
         if (!m_doc.Attr().GetUlfc(key, c)) continue;
-        const std::string place = UlfPlaceText(m_doc.Data(), c.stage, c.step);
-        rows.push_back({key, c.name, UlfNameAt(UlfDescription(c), place)});
+        rows.push_back({key, c.name, UlfConstraintText(m_doc.Data(), c)});
     }
     return rows;
 }

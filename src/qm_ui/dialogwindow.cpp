@@ -65,6 +65,11 @@ void CDialogWindow::accept()
     m_form->ShowFirstMark();
 }
 
+void CDialogWindow::reject()
+{
+    if (!m_view.closes || m_view.closes(m_model)) QDialog::reject();
+}
+
 void CDialogWindow::ShowTexts()
 {
     setWindowTitle(m_view.title ? QString::fromStdString(m_view.title()) : QString());

@@ -19,6 +19,7 @@ public:
 
     CFormView& Form() { return *m_form; }
     void accept() override;
+    void reject() override;
 
 protected:
     void changeEvent(QEvent* event) override;

@@ -12,6 +12,9 @@ struct T_GRID_COLUMN {
     std::function<std::vector<std::string>()> choices{}; // of a Choice
 };
 
+/// Background of a cell that says something: worth a look, or a fault.
+enum class CELL_TONE { Plain, Notice, Fault };
+
 struct T_GRID_BINDING {
     std::vector<T_GRID_COLUMN> columns{};
     std::function<std::size_t()> rows{};
@@ -28,6 +31,8 @@ struct T_GRID_BINDING {
     std::function<int()> selected{};             // the model's choice, shown with each refresh
     std::function<void(std::size_t row)> open{}; // double click, or Enter on a fixed cell
     std::function<std::string(std::size_t row, std::size_t column)> mark{}; // finding of a cell
+    /// Colour of a cell whose text says the same in words.
+    std::function<CELL_TONE(std::size_t row, std::size_t column)> tone{};
 };
 
 /// The whole of a table of records. It must outlive the view.

@@ -6,7 +6,7 @@
 
 namespace {
 
-constexpr QRgb kMarked = 0xffffd9d9U;
+constexpr QRgb kMarked = 0xffffd9d9U, kNoticed = 0xfffff0c2U;
 
 std::size_t Size(int n)
 {
@@ -79,9 +79,12 @@ QVariant CGridModel::data(const QModelIndex& at, int role) const
     case Qt::BackgroundRole: {
         const std::string mark =
             m_binding.mark ? m_binding.mark(Size(at.row()), Size(at.column())) : std::string();
-        if (mark.empty()) return {};
-        return role == Qt::ToolTipRole ? QVariant(QString::fromStdString(mark))
-                                       : QVariant(QColor(kMarked));
+        if (role == Qt::ToolTipRole)
+            return mark.empty() ? QVariant() : QVariant(QString::fromStdString(mark));
+        const CELL_TONE tone =
+            m_binding.tone ? m_binding.tone(Size(at.row()), Size(at.column())) : CELL_TONE::Plain;
+        if (!mark.empty() || tone == CELL_TONE::Fault) return QColor(kMarked);
+        return tone == CELL_TONE::Notice ? QVariant(QColor(kNoticed)) : QVariant();
     }
     default:
         return {};

@@ -135,6 +135,24 @@ void MakeRoom(T_PLOT& plot, double rows)
 
 } // namespace
 
+T_ULF_PICTURE UlfPictureOf(const CUnknownLoadFactorResultDlg& dialog)
+{
+    const T_ULF_RESULT& r = dialog.Result();
+    T_ULF_PICTURE picture;
+    picture.title = "Unknown load factors: " + r.item.name;
+    picture.subtitle =
+        std::string(r.exact ? "solved as equations" : "optimized") + ", " + dialog.ModelTitle();
+    for (const T_ULF_RESULT_ROW& row : dialog.Rows()) {
+        const std::size_t i = picture.bars.size();
+        picture.bars.push_back({UlfNameAt(row.name, row.place), dialog.UnitOf(i), row.value,
+                                row.upper, row.lower, row.active, !row.met, UlfScale(r, i)});
+    }
+    for (std::size_t i = 0; i < r.cases.size(); ++i)
+        picture.notes.push_back(FormatText("%s = %.6g%s", r.cases[i].name.c_str(), r.factors[i],
+                                           r.cases[i].unknown ? "" : " (known)"));
+    return picture;
+}
+
 double UlfPosition(const T_ULF_BAR& b)
 {
     if (IsEquality(b)) {

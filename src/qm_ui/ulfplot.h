@@ -1,6 +1,7 @@
 // Picture of an unknown load factor result: every constrained quantity against its bounds.
 #pragma once
 
+#include "qm_rps/unknownloadfactorresultdlg.h"
 #include "qm_ui/plotdata.h"
 
 #include <optional>
@@ -24,6 +25,9 @@ struct T_ULF_PICTURE {
     std::vector<T_ULF_BAR> bars;
     std::vector<std::string> notes{}; // the factors, say
 };
+
+/// The constraints of a solved item, with its factors as notes.
+[[nodiscard]] T_ULF_PICTURE UlfPictureOf(const CUnknownLoadFactorResultDlg& dialog);
 
 /// Where a value lies: -1 on its lower bound, 1 on its upper bound, 0 in the middle. With one
 /// bound, 0 is the value zero (a bound of zero: the distance is in parts of the scale). Of an

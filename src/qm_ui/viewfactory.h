@@ -20,6 +20,8 @@ struct T_VIEW {
     TextFn accept{};
     bool showsOnly = false; // one button, "Close"
     QSize size{};           // wanted; empty: what the form needs
+    /// Asked before the window closes without accepting; false: it stays open. Empty: it closes.
+    std::function<bool(zql::frx::MDialog& model)> closes{};
 };
 
 /// State: the views that were registered. Belongs to the application; dialogs ask for it.

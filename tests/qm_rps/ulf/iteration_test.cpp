@@ -262,6 +262,20 @@ TEST_F(UlfIteration, GoesOnOnlyWhenThePersonWantsIt)
     EXPECT_EQ(3U, Blocks());
 }
 
+TEST_F(UlfIteration, AsksNoMoreInARunInWhichThePersonWantsItSo)
+{
+    m_host.m_factors = {{2.0, 7.0}}; // never converges
+    m_person.m_dontAsk = true;
+    EXPECT_TRUE(Run(4));
+    EXPECT_EQ(ULF_ITER_END::Required, m_end);
+    EXPECT_EQ(1, m_person.m_dialogs);
+    EXPECT_TRUE(Run(4)); // another run asks again
+    EXPECT_EQ(2, m_person.m_dialogs);
+    m_person.m_accept = 0; // without "iterate" it means nothing
+    EXPECT_TRUE(Run(4));
+    EXPECT_EQ(ULF_ITER_END::Declined, m_end);
+}
+
 TEST_F(UlfIteration, AsksBeforeAnExistingReportIsOverwritten)
 {
     const std::string path = m_folder + "/frame.ulf";

@@ -13,6 +13,8 @@
 class CPerson : public zql::frx::IDialogView {
 public:
     int m_accept = 99; // dialogs in which iteration is chosen
+    int m_dialogs = 0; // that were shown
+    bool m_dontAsk = false;
     bool m_overwrite = false;
     std::vector<std::string> m_asked;
     int m_events = 0;
@@ -30,6 +32,8 @@ public:
         auto* dialog = dynamic_cast<CUlfIterationResultDlg*>(&child);
         if (!dialog) return 0;
         dialog->m_iterate = m_accept-- > 0;
+        dialog->m_dontAsk = m_dontAsk;
+        ++m_dialogs;
         return 1;
     }
     void DispatchEvents() override

@@ -1,0 +1,240 @@
+#include "qm_rps/ulfiterationrundlg.h"
+
+#include "qm_base/messagehistory.h"
+#include "qm_base/msgfunction.h"
+#include "qm_base/textformat.h"
+#include "qm_rps/ulfiterationdochost.h"
+#include "qm_rps/unknownloadfactoriteranaldlg.h"
+#include "qm_rps/unknownloadfactorresultdlg.h"
+
+#include <algorithm>
+#include <filesystem>
+
+using zql::lib::MMSGFunction;
+
+namespace {
+
+struct T_END_KEY {
+    ULF_ITER_END end;
+    const char* key;
+};
+constexpr T_END_KEY kEnds[] = {
+    {ULF_ITER_END::Converged, "IDS_QM_UI_ULF_CONVERGED"},
+    {ULF_ITER_END::Required, "IDS_QM_UI_ULF_NOT_CONVERGED"},
+    {ULF_ITER_END::Declined, "IDS_QM_UI_ULF_DECLINED"},
+    {ULF_ITER_END::Cancelled, "IDS_QM_UI_ULF_CANCELLED"},
+    {ULF_ITER_END::NotSolved, "IDS_QM_UI_ULF_NOT_SOLVED"},
+    {ULF_ITER_END::ReportNotWritten, "IDS_QM_UI_ULF_NO_REPORT"},
+    {ULF_ITER_END::NotSaved, "IDS_QM_UI_ULF_NOT_SAVED"},
+    {ULF_ITER_END::NotScaled, "IDS_QM_UI_ULF_NOT_SCALED"},
+    {ULF_ITER_END::NotAnalysed, "IDS_QM_UI_ULF_NOT_ANALYSED"},
+};
+
+std::string EndText(ULF_ITER_END end, const std::string& reason)
+{
+    const auto* it = std::ranges::find(kEnds, end, &T_END_KEY::end);
+    const std::string text = MMSGFunction::GetValue(it->key);
+    return reason.empty() ? text : text + "\n" + reason;
+}
+
+/// While it lives, the flag is set.
+struct T_RUNNING {
+    bool& flag;
+    explicit T_RUNNING(bool& f) : flag(f) { flag = true; }
+    ~T_RUNNING() { flag = false; }
+    T_RUNNING(const T_RUNNING&) = delete;
+    T_RUNNING& operator=(const T_RUNNING&) = delete;
+};
+
+} // namespace
+
+CUlfIterationRunDlg::CUlfIterationRunDlg(CDBDoc& doc, int item) : m_doc(doc), m_item(item)
+{
+    const std::vector<int> keys = ItemKeys();
+    if (std::ranges::find(keys, item) == keys.end()) m_item = keys.empty() ? 0 : keys.front();
+}
+
+CUlfIterationRunDlg::CUlfIterationRunDlg(CDBDoc& doc, CUnknownStageItemDlg& item)
+    : m_doc(doc), m_given(&item)
+{
+}
+
+std::vector<int> CUlfIterationRunDlg::ItemKeys() const
+{
+    std::vector<int> keys;
+    for (const auto& entry : m_doc.Data().Model().ulfStageItems)
+        keys.push_back(entry.first);
+    return keys;
+}
+
+std::vector<std::string> CUlfIterationRunDlg::ItemTexts() const
+{
+    if (m_given) return {m_given->m_name};
+    std::vector<std::string> names;
+    for (const auto& entry : m_doc.Data().Model().ulfStageItems)
+        names.push_back(entry.second.name);
+    return names;
+}
+
+int CUlfIterationRunDlg::ItemIndex() const
+{
+    if (m_given) return 0;
+    const std::vector<int> keys = ItemKeys();
+    const auto it = std::ranges::find(keys, m_item);
+    return it == keys.end() ? -1 : static_cast<int>(it - keys.begin());
+}
+
+void CUlfIterationRunDlg::OnSelChangeItem(int index)
+{
+    const std::vector<int> keys = ItemKeys();
+    if (m_given || m_running || index < 0 || index >= std::ssize(keys)) return;
+    m_item = keys[static_cast<std::size_t>(index)];
+    Clear();
+}
+
+void CUlfIterationRunDlg::Clear()
+{
+    m_history.clear();
+    m_result.reset();
+    m_status.clear();
+    m_step = -1;
+}
+
+int CUlfIterationRunDlg::OnShowResult()
+{
+    if (!m_result || m_running) return 0;
+    CUnknownLoadFactorResultDlg dialog(m_doc, *m_result);
+    dialog.SetView(View());
+    (void)dialog.DoModal();
+    return 1;
+}
+
+T_ULF_ITER_SETTINGS CUlfIterationRunDlg::Settings() const
+{
+    const auto* settings = CUnknownLoadFactorIterAnal::Of(m_doc.DynModules());
+    return settings ? settings->Settings() : T_ULF_ITER_SETTINGS();
+}
+
+int CUlfIterationRunDlg::OnSettings()
+{
+    auto* settings = CUnknownLoadFactorIterAnal::Of(m_doc.DynModules());
+    if (!settings || m_running) return 0;
+    CUnknownLoadFactorIterAnalDlg dialog(*settings);
+    dialog.SetView(View());
+    return dialog.DoModal();
+}
+
+void CUlfIterationRunDlg::Tell(std::string status)
+{
+    m_status = std::move(status);
+    if (m_changed) m_changed();
+}
+
+int CUlfIterationRunDlg::Fail(const std::string& text)
+{
+    Tell(text);
+    return 0;
+}
+
+bool CUlfIterationRunDlg::OnClose()
+{
+    if (m_running) OnCancelRun();
+    return !m_running;
+}
+
+std::string CUlfIterationRunDlg::StatusText() const
+{
+    return m_status.empty() ? MMSGFunction::GetValue("IDS_QM_UI_ULF_READY") : m_status;
+}
+
+int CUlfIterationRunDlg::Analyse()
+{
+    if (m_doc.Post().CheckStagedResult()) return 1;
+    Tell(MMSGFunction::GetValue("IDS_QM_UI_ANALYSING"));
+    const auto goesOn = [this](std::size_t, std::size_t) {
+        if (View()) View()->DispatchEvents();
+        return !m_cancel;
+    };
+    T_ANALYSIS_OPTIONS options;
+    options.allCases = false;
+    T_ANALYSIS_ERROR error;
+    if (RunWatchedAnalysis(m_doc, options, goesOn, error)) return 1;
+    const bool cancelled = error.fault == ANALYSIS_FAULT::Cancelled;
+    return Fail(EndText(cancelled ? ULF_ITER_END::Cancelled : ULF_ITER_END::NotAnalysed,
+                        cancelled ? std::string() : error.text));
+}
+
+int CUlfIterationRunDlg::OnRun()
+{
+    if (m_running) return 0;
+    const T_RUNNING running(m_running);
+    m_cancel = false;
+    Clear();
+    const int done = Start();
+    GSaveHistoryFormatNF("%s", StatusText().c_str());
+    return done;
+}
+
+int CUlfIterationRunDlg::Start()
+{
+    // Copies and report stand beside the model.
+    if (m_doc.Path().empty()) return Fail(MMSGFunction::GetValue("IDS_QM_UI_ULF_SAVE_FIRST"));
+    std::unique_ptr<CUnknownStageItemDlg> own;
+    if (!m_given) own = std::make_unique<CUnknownStageItemDlg>(m_doc, m_results, m_item);
+    CUnknownStageItemDlg& item = m_given ? *m_given : *own;
+    if (own) own->SetView(View());
+    if (const auto findings = item.Findings(); !findings.empty())
+        return Fail(findings.front().text);
+    if (!Analyse()) return 0;
+
+    CUlfIterationDocHost host(m_doc, item, View());
+    CUlfIteration run(host, Settings());
+    const auto tellDone = [this](int iterations, int required) {
+        return MMSGFunction::Format("IDS_QM_UI_ULF_RUNNING",
+                                    {std::to_string(iterations), std::to_string(required)});
+    };
+    run.m_solved = [&] {
+        m_history = run.History();
+        m_result = item.Result();
+        m_step = static_cast<int>(m_history.size()) - 1;
+        Tell(tellDone(m_history.back().iteration, Settings().required));
+    };
+    run.m_progress = [&](int iterations, int required) {
+        std::string status = tellDone(iterations, required);
+        if (status != m_status) Tell(std::move(status));
+        if (View()) View()->DispatchEvents(); // a cancel that came while the factors were found
+        return !m_cancel;
+    };
+    zql::frx::IDialogView* const before = item.View();
+    item.SetView(View());
+    const int done = item.OnIterate(run);
+    item.SetView(before);
+    m_report = run.ReportPath();
+    const bool plain = run.End() == ULF_ITER_END::Required && Settings().required == 0;
+    Tell(plain ? MMSGFunction::GetValue("IDS_QM_UI_ULF_SOLVED") : EndText(run.End(), host.Error()));
+    return done;
+}
+
+std::string CUlfIterationRunDlg::StepText(std::size_t row, std::size_t column) const
+{
+    if (row >= m_history.size()) return {};
+    const T_ULF_ITER_STEP& step = m_history[row];
+    if (column == 0) return std::to_string(step.iteration);
+    return column == 1 ? FormatText("%.6g", step.tolerance)
+                       : std::filesystem::path(step.file).filename().string();
+}
+
+std::size_t CUlfIterationRunDlg::Rows() const
+{
+    const auto step = static_cast<std::size_t>(m_step);
+    return m_step >= 0 && step < m_history.size() ? m_history[step].rows.size() : 0;
+}
+
+std::string CUlfIterationRunDlg::RowText(std::size_t row, std::size_t column) const
+{
+    if (row >= Rows()) return {};
+    const auto step = m_history.begin() + m_step;
+    if (column < CUlfIterationResultDlg::kHeads.size())
+        return UlfIterCellText(step->rows[row], column);
+    return FormatText("%.9g", UlfIterApplied({m_history.begin(), step + 1})[row]);
+}
