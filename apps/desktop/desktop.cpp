@@ -38,6 +38,14 @@ int RunWithProgress(QWidget* parent, const QString& title,
     window.setWindowModality(Qt::ApplicationModal);
     window.setMinimumDuration(kWaitMs);
     window.setValue(0);
+    // The window comes up after a while; until then nothing else may be clicked either.
+    struct T_DISABLED {
+        explicit T_DISABLED(QWidget* of) : widget(of) { widget->setEnabled(false); }
+        ~T_DISABLED() { widget->setEnabled(true); }
+        T_DISABLED(const T_DISABLED&) = delete;
+        T_DISABLED& operator=(const T_DISABLED&) = delete;
+        QWidget* widget;
+    } const disabled(parent);
     return work([&window](std::size_t done, std::size_t total) {
         const double part = total ? static_cast<double>(done) / static_cast<double>(total) : 0.0;
         window.setValue(static_cast<int>(part * (kParts - 1)));

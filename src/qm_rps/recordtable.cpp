@@ -3,7 +3,7 @@
 std::string HeadWithUnit(const std::string& head, const std::optional<T_DIM>& dim,
                          const T_UNITS& units)
 {
-    std::string text = head.starts_with("IDS_") ? zql::lib::MMSGFunction::GetValue(head) : head;
+    const std::string text = zql::lib::MMSGFunction::GetValue(head); // a symbol stays
     if (!dim) return text;
     const auto part = [](std::string_view unit, int exponent) {
         return exponent == 1 ? std::string(unit) : std::string(unit) + std::to_string(exponent);

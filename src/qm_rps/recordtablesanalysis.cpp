@@ -45,8 +45,7 @@ std::string SpectrumKind(const T_SPFC_D& spectrum)
 {
     constexpr std::array<const char*, 5> names{"ATC-40", "EN 1998-1:2004", "ENV 1998-1:1994", "NTC",
                                                "IDS_QM_UI_SPECTRUM_USER"};
-    const char* const name = names.at(spectrum.data.index());
-    return std::string_view(name).starts_with("IDS_") ? TextOf(name) : name;
+    return TextOf(names.at(spectrum.data.index())); // names of codes stay
 }
 
 } // namespace
