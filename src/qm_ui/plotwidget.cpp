@@ -55,6 +55,16 @@ void CPlotWidget::SetPlot(T_PLOT plot)
     SetView({});
 }
 
+void CPlotWidget::UpdatePlot(T_PLOT plot)
+{
+    if (plot == m_plot) return;
+    const bool sameAxes = plot.x.title == m_plot.x.title && plot.y.title == m_plot.y.title &&
+                          plot.x.log == m_plot.x.log && plot.y.log == m_plot.y.log;
+    if (!sameAxes) return SetPlot(std::move(plot));
+    m_plot = std::move(plot);
+    Forget();
+}
+
 void CPlotWidget::SetView(const T_PLOT_VIEW& view)
 {
     m_view = view;

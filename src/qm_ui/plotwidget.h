@@ -21,6 +21,8 @@ public:
     explicit CPlotWidget(QWidget* parent = nullptr);
 
     void SetPlot(T_PLOT plot); // shows the whole plot
+    /// The same picture with other values: while the axes are the same, the part on show stays.
+    void UpdatePlot(T_PLOT plot);
     [[nodiscard]] const T_PLOT& Plot() const { return m_plot; }
     [[nodiscard]] const T_PLOT_VIEW& View() const { return m_view; }
     void SetView(const T_PLOT_VIEW& view);
