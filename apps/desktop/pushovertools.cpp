@@ -24,13 +24,15 @@ T_WINDOW_EXAMPLE CurveExample(const char* name, const char* evaluation, int tria
                 if (!window->Model().OnOpen(evaluation)) return nullptr;
                 window->Model().SetTrial(trial);
                 window->Form().Refresh();
+                window->show();
+                window->resize(1280, 860);
                 return window;
             }};
 }
 
 /// The window of a dialog model that `make` fills.
 template <class MODEL, class MAKE>
-T_WINDOW_EXAMPLE DialogExample(const char* name, MAKE make)
+T_WINDOW_EXAMPLE DialogExample(const char* name, QSize size, MAKE make)
 {
     return {name, "rc-frame-3-storey", [=](CMainWindow& main) -> std::unique_ptr<QWidget> {
                 std::unique_ptr<MODEL> model = make(main.Doc());
@@ -38,6 +40,8 @@ T_WINDOW_EXAMPLE DialogExample(const char* name, MAKE make)
                 auto window =
                     std::make_unique<CDialogWindow>(main.Desktop().factory, *view, *model, nullptr);
                 (void)KeepWith(*window, std::move(model));
+                window->show();
+                window->resize(size);
                 return window;
             }};
 }
@@ -119,6 +123,6 @@ std::vector<T_WINDOW_EXAMPLE> PushoverWindowExamples()
             CurveExample("pushover-fema440", "PX_MODE1 FEMA440 C", 0),
             CurveExample("pushover-ec8", "PX_MODE1 EC8", 0),
             CurveExample("pushover-ntc", "PX_MODE1 NTC2018", 0),
-            DialogExample<CPushOverComparisonDlg>("pushover-comparison", comparison),
-            DialogExample<CPushOverCurveDampParamUser>("pushover-damping", damping)};
+            DialogExample<CPushOverComparisonDlg>("pushover-comparison", {1000, 880}, comparison),
+            DialogExample<CPushOverCurveDampParamUser>("pushover-damping", {560, 560}, damping)};
 }

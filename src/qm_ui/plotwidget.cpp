@@ -38,9 +38,15 @@ CPlotWidget::CPlotWidget(QWidget* parent) : QWidget(parent)
     setSizePolicy(QSizePolicy::Expanding, QSizePolicy::Expanding);
 }
 
+void CPlotWidget::SetSizeHint(const QSize& size)
+{
+    m_wanted = size;
+    updateGeometry();
+}
+
 QSize CPlotWidget::sizeHint() const
 {
-    return {960, 640};
+    return m_wanted;
 }
 
 QSize CPlotWidget::minimumSizeHint() const

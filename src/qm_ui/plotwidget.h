@@ -7,6 +7,7 @@
 #include <QPixmap>
 #include <QPoint>
 #include <QPointF>
+#include <QSize>
 #include <QWidget>
 
 #include <cstddef>
@@ -34,6 +35,8 @@ public:
     /// Empty when no point is near.
     [[nodiscard]] QString ReadOut(QPointF pos);
 
+    /// The size that a window gives it at first, 960 x 640 otherwise.
+    void SetSizeHint(const QSize& size);
     [[nodiscard]] QSize sizeHint() const override;
     [[nodiscard]] QSize minimumSizeHint() const override;
 
@@ -64,6 +67,7 @@ private:
     [[nodiscard]] QString HitText(const T_HIT& hit) const;
     void DrawReadOut(QPainter& painter);
 
+    QSize m_wanted{960, 640};
     T_PLOT m_plot;
     T_PLOT_VIEW m_view;
     std::optional<T_PLOT_LAYOUT> m_layout; // empty: to be computed

@@ -98,6 +98,7 @@ void BuildDamping(CFormView& form, MODEL& m)
     auto& damping = form.Number(KeyText("IDS_QM_UI_PUSH_ELASTIC_DAMPING"),
                                 OrDefault(s.elasticDamping, 5.0), PlainLabel("%"));
     damping.name = "elasticDamping";
+    damping.shown = [&m] { return !m.IsTarget(); };
     auto& user = form.Button(KeyText("IDS_QM_UI_PUSH_USER_DAMPING"), [&m] { m.OnUserDamping(); });
     user.name = "userDamping";
     user.shown = [&m] { return m.HasUserDamping(); };
@@ -255,16 +256,24 @@ void BuildPushOverCurve(CFormView& form, CPushOverCurveEdit& m)
     form.Page(KeyText("IDS_QM_UI_PUSH_PAGE_METHOD"));
     BuildMethod(form, m);
     BuildDamping(form, m);
+    form.Space();
     form.Page(KeyText("IDS_QM_UI_PUSH_PAGE_BILINEAR"), [&m] { return m.IsTarget(); });
     BuildBilinear(form, m);
+    form.Space();
     form.Page(KeyText("IDS_QM_UI_PUSH_PAGE_SHOWN"));
     BuildShown(form, m);
+    form.Space();
     form.EndPages();
-    form.NextColumn();
+    form.NextColumn(1);
     auto& refusal = form.Note([&m] { return m.Refusal(); });
     refusal.name = "refusal";
     refusal.shown = [&m] { return !m.Refusal().empty(); };
-    form.Picture([&m] { return PlotOf(m); }).name = "plot";
+    const auto plot = [&m] {
+        T_PLOT shown = PlotOf(m);
+        shown.notes.clear(); // their values stand in the cells
+        return shown;
+    };
+    AddPicture(form, plot, {680, 400}).name = "plot";
     auto& trial =
         form.Custom(KeyText("IDS_QM_UI_PUSH_TRIAL"),
                     MakeStepField(

@@ -15,7 +15,7 @@ void BuildUserDamping(CFormView& form, CPushOverCurveDampParamUser& m)
     form.Number(KeyText("IDS_QM_UI_PUSH_KAPPA_1"), Ref(m.m_kappa1)).name = "kappa1";
     form.Number(KeyText("IDS_QM_UI_PUSH_BETA_2"), Ref(m.m_beta2), PlainLabel("%")).name = "beta2";
     form.Number(KeyText("IDS_QM_UI_PUSH_KAPPA_2"), Ref(m.m_kappa2)).name = "kappa2";
-    form.Picture([&m] { return UserDampingPlot(m); });
+    AddPicture(form, [&m] { return UserDampingPlot(m); }, {480, 300});
 }
 
 void BuildPushOverText(CFormView& form, CPushOverTextDlg& m)
@@ -44,7 +44,12 @@ void BuildPushOverComparison(CFormView& form, CPushOverComparisonDlg& m)
             KeyTexts({"IDS_QM_UI_PUSH_TYPE_A", "IDS_QM_UI_PUSH_TYPE_B", "IDS_QM_UI_PUSH_TYPE_C"}))
         .name = "behavior";
     form.EndColumns();
-    form.Picture([&m] { return ComparisonPlot(m.Comparison()); }).name = "plot";
+    const auto plot = [&m] {
+        T_PLOT shown = ComparisonPlot(m.Comparison());
+        shown.notes.clear(); // their values stand in the table
+        return shown;
+    };
+    AddPicture(form, plot, {720, 400}).name = "plot";
     form.Grid(GridOf([&m] { return m.Cells(); })).name = "table";
     form.Note([&m] { return m.SpreadText(); }).name = "spread";
     form.Button(KeyText("IDS_QM_UI_PUSH_PICTURE"),

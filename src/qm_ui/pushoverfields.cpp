@@ -1,5 +1,7 @@
 #include "qm_ui/pushoverfields.h"
 
+#include "qm_ui/plotwidget.h"
+
 #include <QFontDatabase>
 #include <QHBoxLayout>
 #include <QPlainTextEdit>
@@ -95,6 +97,13 @@ std::unique_ptr<CFormField> MakeStepField(T_BINDING<int> binding, std::function<
 {
     return std::make_unique<CStepField>(std::move(binding), std::move(most), std::move(changed),
                                         parent);
+}
+
+CFormField& AddPicture(CFormView& form, std::function<T_PLOT()> plot, const QSize& size)
+{
+    CFormField& field = form.Picture(std::move(plot));
+    if (auto* widget = dynamic_cast<CPlotWidget*>(field.widget)) widget->SetSizeHint(size);
+    return field;
 }
 
 std::unique_ptr<CFormField> MakeTextPage(TextFn text, QWidget* parent)

@@ -21,5 +21,7 @@ T_BINDING<T> OrDefault(std::optional<T>& value, T absent)
 /// A number from 0 to what `most` says, by a slider and an edit field with arrows.
 std::unique_ptr<CFormField> MakeStepField(T_BINDING<int> binding, std::function<int()> most,
                                           ChangedFn changed, QWidget* parent);
+/// Adds a picture that wants no more than this size.
+CFormField& AddPicture(CFormView& form, std::function<T_PLOT()> plot, const QSize& size);
 /// Lines of a text in a fixed-width font, to be read and copied.
 std::unique_ptr<CFormField> MakeTextPage(TextFn text, QWidget* parent);
