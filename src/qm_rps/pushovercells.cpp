@@ -92,6 +92,7 @@ std::string PerfPointPair(const T_PUSH_EVALUATION& e, double T_PERF_POINT::*firs
 T_TEXT_TABLE PushoverResultCells(const T_PUSH_EVALUATION& e)
 {
     T_TEXT_TABLE t{{{Text("IDS_QM_UI_PUSH_VALUE_OF")}, Column(Text("IDS_QM_UI_PUSH_VALUE"))}, {}};
+    t.rows.push_back({Text("IDS_QM_UI_PUSH_OUTCOME"), OutcomeName(e.outcome)});
     if (e.IsTarget())
         AddTargetCells(e, t);
     else

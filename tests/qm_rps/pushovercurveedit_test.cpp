@@ -122,7 +122,7 @@ TEST(PushOverCurveEdit, ACurveWithoutSpectrumKeepsTheLastPictureButNotItsValues)
     EXPECT_FALSE(edit->Result().point);
     EXPECT_EQ("PX", edit->Pictured().eval.push);
     EXPECT_NE("", edit->Refusal());
-    EXPECT_EQ("-", PushoverResultCells(edit->Result()).rows.at(0).at(1));
+    EXPECT_EQ("-", PushoverResultCells(edit->Result()).rows.at(1).at(1));
 }
 
 TEST(PushOverCurveEdit, AnotherMethodTakesAProcedureAndPlotThatItHas)
