@@ -1,4 +1,5 @@
 // The frame in the window: the step slider against drawing its lines once, and the cold start.
+#include "benchapp.h"
 #include "framepane.h"
 #include "ratios.h"
 
@@ -16,16 +17,6 @@ namespace {
 
 constexpr int kBays = 25, kDeep = 25, kStoreys = 11; // 20,436 elements
 constexpr int kSteps = 20;
-
-QApplication& App()
-{
-    static int count = 1;
-    static char name[] = "qm_bench";
-    static char* arguments[] = {name, nullptr};
-    qputenv("QT_QPA_PLATFORM", "offscreen");
-    static QApplication app(count, arguments);
-    return app;
-}
 
 int NodeAt(int x, int y, int z)
 {
@@ -74,7 +65,7 @@ struct T_BENCH {
     std::unique_ptr<CFramePane> pane;
     T_BENCH()
     {
-        (void)App();
+        NeedBenchApp();
         doc.Data().Assign(Content());
         pane = std::make_unique<CFramePane>(scene);
         pane->resize(1000, 760);

@@ -1,18 +1,128 @@
 #include "pushovertools.h"
 
-void RegisterPushoverViews(CViewFactory&) {}
+#include "mainwindow.h"
+#include "pushoverwindow.h"
 
-T_COMMANDS PushoverCommands(T_DESKTOP&)
+#include "qm_base/msgfunction.h"
+#include "qm_rps/pushovercomparisondlg.h"
+#include "qm_rps/pushovercurvedampparamuser.h"
+#include "qm_rps/pushovertextdlg.h"
+#include "qm_ui/pushovercurveview.h"
+
+namespace {
+
+QString Text(const char* key)
 {
-    return {};
+    return QString::fromStdString(zql::lib::MMSGFunction::GetValue(key));
 }
 
-bool OpenPushoverRecord(T_DESKTOP&, EXPLORER_TABLE, int)
+/// The picture of an open curve window on an evaluation of the example.
+T_WINDOW_EXAMPLE CurveExample(const char* name, const char* evaluation, int trial)
 {
-    return false;
+    return {name, "rc-frame-3-storey", [=](CMainWindow& main) -> std::unique_ptr<QWidget> {
+                auto window = CPushOverWindow::Make(main.Desktop(), nullptr);
+                if (!window->Model().OnOpen(evaluation)) return nullptr;
+                window->Model().SetTrial(trial);
+                window->Form().Refresh();
+                window->show();
+                window->resize(1280, 860);
+                return window;
+            }};
+}
+
+/// The window of a dialog model that `make` fills.
+template <class MODEL, class MAKE>
+T_WINDOW_EXAMPLE DialogExample(const char* name, QSize size, MAKE make)
+{
+    return {name, "rc-frame-3-storey", [=](CMainWindow& main) -> std::unique_ptr<QWidget> {
+                std::unique_ptr<MODEL> model = make(main.Doc());
+                const T_VIEW* view = main.Desktop().factory.Find(*model);
+                auto window =
+                    std::make_unique<CDialogWindow>(main.Desktop().factory, *view, *model, nullptr);
+                (void)KeepWith(*window, std::move(model));
+                window->show();
+                window->resize(size);
+                return window;
+            }};
+}
+
+T_VIEW ShowsOnly(int width, int height)
+{
+    T_VIEW view;
+    view.showsOnly = true;
+    view.size = QSize(width, height);
+    return view;
+}
+
+} // namespace
+
+void RegisterPushoverViews(CViewFactory& factory)
+{
+    factory.Register<CPushOverCurveEdit>(KeyText("IDS_QM_UI_PUSH_TITLE"), BuildPushOverCurve,
+                                         ShowsOnly(1280, 860));
+    factory.Register<CPushOverCurveDampParamUser>(KeyText("IDS_QM_UI_PUSH_USER_TITLE"),
+                                                  BuildUserDamping);
+    factory.Register<CPushOverTextDlg>(KeyText("IDS_QM_UI_PUSH_TEXT_TITLE"), BuildPushOverText,
+                                       ShowsOnly(900, 640));
+    factory.Register<CPushOverComparisonDlg>(KeyText("IDS_QM_UI_PUSH_COMPARE_TITLE"),
+                                             BuildPushOverComparison, ShowsOnly(1000, 860));
+}
+
+T_COMMANDS PushoverCommands(T_DESKTOP& desktop)
+{
+    constexpr const char* kMenu = "IDS_QM_UI_MENU_PUSHOVER";
+    const auto hasCase = [&desktop] { return !desktop.doc.Data().Model().pushovers.empty(); };
+    const auto fresh = [&desktop] {
+        CPushOverWindow& window = CPushOverWindow::Show(desktop);
+        window.Model().OnNew();
+        window.Form().Refresh();
+    };
+    const auto compare = [&desktop] {
+        CPushOverComparisonDlg comparison(desktop.doc);
+        comparison.SetView(&desktop.view);
+        comparison.m_askPath = [&desktop] {
+            return AskFileName(desktop.window, true, Text("IDS_QM_UI_PUSH_COMPARE_TITLE"),
+                               Text("IDS_QM_UI_PICTURE_FILTER"))
+                .toStdString();
+        };
+        comparison.Update();
+        (void)comparison.DoModal();
+    };
+    return {{kMenu, "IDS_QM_UI_PUSH_CURVE", "F7", [&desktop] { CPushOverWindow::Show(desktop); },
+             hasCase},
+            {kMenu, "IDS_QM_UI_PUSH_NEW_CURVE", "Shift+F7", fresh, hasCase},
+            {kMenu, "IDS_QM_UI_PUSH_COMPARE_ALL", "Ctrl+F7", compare, hasCase}};
+}
+
+bool OpenPushoverRecord(T_DESKTOP& desktop, EXPLORER_TABLE table, int key)
+{
+    if (table != EXPLORER_TABLE::Evaluations) return false;
+    T_EVAL_D evaluation;
+    if (!desktop.doc.Attr().GetEval(key, evaluation)) return false;
+    CPushOverWindow& window = CPushOverWindow::Show(desktop);
+    (void)window.Model().OnOpen(evaluation.name);
+    window.Form().Refresh();
+    return true;
 }
 
 std::vector<T_WINDOW_EXAMPLE> PushoverWindowExamples()
 {
-    return {};
+    const auto comparison = [](CDBDoc& doc) {
+        auto model = std::make_unique<CPushOverComparisonDlg>(doc);
+        model->m_spectrum = "ATC strong";
+        model->m_behavior = 1;
+        model->Update();
+        return model;
+    };
+    const auto damping = [](CDBDoc&) {
+        auto model = std::make_unique<CPushOverCurveDampParamUser>();
+        model->Data2Dlg({3, 5.0, 10.0, 0.9, 40.0, 0.4});
+        return model;
+    };
+    return {CurveExample("pushover-atc40", "PX_MODE1 ATC-40 A", 2),
+            CurveExample("pushover-fema440", "PX_MODE1 FEMA440 C", 0),
+            CurveExample("pushover-ec8", "PX_MODE1 EC8", 0),
+            CurveExample("pushover-ntc", "PX_MODE1 NTC2018", 0),
+            DialogExample<CPushOverComparisonDlg>("pushover-comparison", {1000, 880}, comparison),
+            DialogExample<CPushOverCurveDampParamUser>("pushover-damping", {560, 560}, damping)};
 }

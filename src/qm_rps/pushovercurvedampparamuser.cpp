@@ -1,5 +1,6 @@
 #include "qm_rps/pushovercurvedampparamuser.h"
 
+#include <algorithm>
 #include <cmath>
 
 void CPushOverCurveDampParamUser::Data2Dlg(const T_DAMP_PARAM& damping)
@@ -16,6 +17,15 @@ void CPushOverCurveDampParamUser::Dlg2Data(T_DAMP_PARAM& damping) const
     damping.kappa1 = m_kappa1;
     damping.beta2 = m_beta2;
     damping.kappa2 = m_kappa2;
+}
+
+std::vector<T_POINT2> CPushOverCurveDampParamUser::Curve() const
+{
+    constexpr double kFullLoopPct = 63.7;
+    return {{0.0, m_kappa1},
+            {m_beta1, m_kappa1},
+            {m_beta2, m_kappa2},
+            {std::max(m_beta2, kFullLoopPct), m_kappa2}};
 }
 
 int CPushOverCurveDampParamUser::CheckData()

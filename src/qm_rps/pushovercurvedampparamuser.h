@@ -13,6 +13,10 @@ public:
     /// Writes the four values into the settings.
     void Dlg2Data(T_DAMP_PARAM& damping) const;
 
+    /// Kappa over the hysteretic damping, for a picture: level to beta1, straight to beta2, level
+    /// beyond, up to the damping of a rectangular loop (63.7 per cent) or beta2.
+    std::vector<T_POINT2> Curve() const;
+
     /// beta1 <= beta2, both above 0 and all finite; the kappa values are as the engineer wants
     /// them. 0 shows IDS_PUSHOVER_Wrong_Input_ and the dialog stays open.
     int CheckData() override;

@@ -9,6 +9,7 @@
 #include "qm_rps/pushovercalcperfptfema440procc.h"
 #include "qm_rps/pushovercalcperfptproca.h"
 #include "qm_rps/pushovercalcperfptprocb.h"
+#include "qm_rps/pushovercells.h"
 #include "qm_rps/pushovercurvesub1dlg.h"
 #include "qm_rps/pushovercurvesub4dlg.h"
 
@@ -463,9 +464,7 @@ void CPushOverCurveDlg::PlotCurve()
 
 std::string CPushOverCurveDlg::PerfPointCell() const
 {
-    if (!m_result.point) return "-";
-    const std::string cell = FormatText("%6.4g,  %6.4g", m_result.point->Sd, m_result.point->Sa);
-    return m_result.result == kPerfPtElastic ? "Elastic(" + cell + ")" : cell;
+    return PerfPointPair(m_result, &T_PERF_POINT::Sd, &T_PERF_POINT::Sa);
 }
 
 bool CPushOverCurveDlg::ExistEC8OrMasonry() const

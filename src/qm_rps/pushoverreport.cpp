@@ -258,9 +258,7 @@ std::string PushoverReportText(const T_PUSH_EVALUATION& e)
     return s + PushoverCurveText(e);
 }
 
-namespace {
-
-int WriteText(const std::string& path, const std::string& text, std::string& error)
+int WritePushoverText(const std::string& text, const std::string& path, std::string& error)
 {
     T_FILE_ERROR fault;
     if (CFileCtrl::WriteWholeFile(path, text, fault)) return 1;
@@ -269,14 +267,12 @@ int WriteText(const std::string& path, const std::string& text, std::string& err
     return 0;
 }
 
-} // namespace
-
 int WritePushoverReport(const T_PUSH_EVALUATION& e, const std::string& path, std::string& error)
 {
-    return WriteText(path, PushoverReportText(e), error);
+    return WritePushoverText(PushoverReportText(e), path, error);
 }
 
 int WritePushoverCurve(const T_PUSH_EVALUATION& e, const std::string& path, std::string& error)
 {
-    return WriteText(path, PushoverCurveText(e), error);
+    return WritePushoverText(PushoverCurveText(e), path, error);
 }

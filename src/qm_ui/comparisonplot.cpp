@@ -1,5 +1,6 @@
 #include "qm_ui/comparisonplot.h"
 
+#include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_ui/adrscurve.h"
 
@@ -7,6 +8,13 @@
 #include <vector>
 
 namespace {
+
+using zql::lib::MMSGFunction;
+
+std::string Text(const char* key)
+{
+    return MMSGFunction::GetValue(key);
+}
 
 /// Performance points as circles, target displacements as squares. Points that lie closer than
 /// 2 % of the picture share one label.
@@ -36,8 +44,9 @@ void AddNotes(T_PLOT& plot, const T_PUSH_COMPARISON& c, const std::string& unit)
             row.found ? FormatText("%s: D = %.4g %s", row.label.c_str(), row.D, unit.c_str())
                       : row.label + ": " + OutcomeName(row.outcome));
     if (c.count > 0)
-        plot.notes.push_back(FormatText("Spread of D: %.4g to %.4g %s, ratio %.3g", c.minD, c.maxD,
-                                        unit.c_str(), c.maxD / c.minD));
+        plot.notes.push_back(MMSGFunction::Format(
+            "IDS_QM_UI_PLOT_SPREAD", {FormatText("%.4g", c.minD), FormatText("%.4g", c.maxD), unit,
+                                      FormatText("%.3g", c.maxD / c.minD)}));
 }
 
 } // namespace
@@ -48,18 +57,20 @@ T_PLOT ComparisonPlot(const T_PUSH_COMPARISON& c)
     if (c.results.empty()) return plot;
     const T_PUSH_EVALUATION& first = c.results.front();
     const std::string unit(NameOf(first.units.length));
-    plot.title = "All methods, pushover " + first.eval.push;
-    plot.subtitle = "Spectrum " + first.eval.spectrum +
-                    "; circles: performance points, squares: target displacements";
-    plot.x.title = "Spectral displacement Sd (" + unit + ")";
-    plot.y.title = "Spectral acceleration Sa (g)";
-    AddAdrsCurve(plot, "Elastic demand", first.demand, PLOT_LINE::Solid, 1.6, {20, 64, 140});
-    AddAdrsCurve(plot, "Capacity", first.capacity, PLOT_LINE::Solid, 2.6, {0, 0, 0});
+    plot.title = MMSGFunction::Format("IDS_QM_UI_PLOT_ALL_METHODS", {first.eval.push});
+    plot.subtitle = MMSGFunction::Format("IDS_QM_UI_PLOT_ALL_SUBTITLE", {first.eval.spectrum});
+    plot.x.title = Text("IDS_QM_UI_PLOT_SD") + " (" + unit + ")";
+    plot.y.title = Text("IDS_QM_UI_PLOT_SA") + " (g)";
+    AddAdrsCurve(plot, Text("IDS_QM_UI_PLOT_DEMAND").c_str(), first.demand, PLOT_LINE::Solid, 1.6,
+                 {20, 64, 140});
+    AddAdrsCurve(plot, Text("IDS_QM_UI_PLOT_CAPACITY").c_str(), first.capacity, PLOT_LINE::Solid,
+                 2.6, {0, 0, 0});
     for (const T_PUSH_EVALUATION& e : c.results) {
         if (e.eval.method != PUSH_METHOD::Ec8Opcm || !e.bilinear) continue;
         const T_BILINEAR& b = *e.bilinear;
-        AddAdrsCurve(plot, "Bilinear capacity (EC8)", {{0.0, b.dy, b.du}, {0.0, b.ay, b.au}},
-                     PLOT_LINE::DashDot, 1.6, {20, 110, 60});
+        AddAdrsCurve(plot, (Text("IDS_QM_UI_PLOT_BILINEAR") + " (EC8)").c_str(),
+                     {{0.0, b.dy, b.du}, {0.0, b.ay, b.au}}, PLOT_LINE::DashDot, 1.6,
+                     {20, 110, 60});
     }
     AddNotes(plot, c, unit);
     double x = 0.0, y = 0.0;

@@ -1,5 +1,6 @@
 #include "qm_ui/evaluationplot.h"
 
+#include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_ui/adrscurve.h"
 
@@ -11,6 +12,20 @@ namespace {
 
 constexpr T_PLOT_COLOR kBlack{0, 0, 0}, kBlue{20, 64, 140}, kRed{184, 40, 30}, kOchre{190, 120, 20},
     kGreen{20, 110, 60}, kGray{120, 120, 120};
+
+using zql::lib::MMSGFunction;
+
+std::string Text(const char* key)
+{
+    return MMSGFunction::GetValue(key);
+}
+
+/// "D demand = 12.3 m".
+std::string ValueText(const std::string& what, double value, const char* format,
+                      const std::string& unit)
+{
+    return what + " = " + FormatText(format, value) + (unit.empty() ? "" : " " + unit);
+}
 
 std::string LengthUnit(const T_PUSH_EVALUATION& e)
 {
@@ -25,13 +40,14 @@ std::string ForceUnit(const T_PUSH_EVALUATION& e)
 void AddDemands(T_PLOT& plot, const T_PUSH_EVALUATION& e)
 {
     if (e.stateDemands.empty()) {
-        AddAdrsCurve(plot, "Elastic demand", e.demand, PLOT_LINE::Solid, 1.6, kBlue);
+        AddAdrsCurve(plot, Text("IDS_QM_UI_PLOT_DEMAND").c_str(), e.demand, PLOT_LINE::Solid, 1.6,
+                     kBlue);
         return;
     }
     constexpr std::array<PLOT_LINE, 4> kLines{PLOT_LINE::Dot, PLOT_LINE::DashDot, PLOT_LINE::Dash,
                                               PLOT_LINE::Solid};
     for (std::size_t i = 0; i < e.stateDemands.size(); ++i) {
-        const std::string name = std::string("Elastic demand ") + kLimitStateNames[i];
+        const std::string name = Text("IDS_QM_UI_PLOT_DEMAND") + " " + kLimitStateNames[i];
         AddAdrsCurve(plot, name.c_str(), e.stateDemands[i], kLines[i], 1.6, kBlue);
     }
 }
@@ -63,7 +79,8 @@ void AddTrials(T_PLOT& plot, const T_PUSH_EVALUATION& e)
         points.Sd.push_back(t.dpi);
         points.Sa.push_back(t.api);
     }
-    AddAdrsCurve(plot, "Trial points", points, PLOT_LINE::None, 1.0, kOchre, PLOT_MARKER::Square);
+    AddAdrsCurve(plot, Text("IDS_QM_UI_PLOT_TRIALS").c_str(), points, PLOT_LINE::None, 1.0, kOchre,
+                 PLOT_MARKER::Square);
     constexpr std::size_t kNumbered = 6;
     if (e.trace.size() > kNumbered) return;
     for (const T_PERFPT_TRIAL& t : e.trace)
@@ -74,11 +91,12 @@ void AddPoint(T_PLOT& plot, const T_PUSH_EVALUATION& e)
 {
     if (!e.point) return;
     const T_PERF_POINT& p = *e.point;
-    const char* const title = e.result == 2 ? "Performance point (elastic)" : "Performance point";
-    plot.labels.push_back(
-        {p.Sd, p.Sa,
-         FormatText("%s\nSd = %.4g %s, Sa = %.4g g", title, p.Sd, LengthUnit(e).c_str(), p.Sa),
-         PLOT_MARKER::Circle, true});
+    const std::string title =
+        Text(e.result == 2 ? "IDS_QM_UI_PLOT_ELASTIC_POINT" : "IDS_QM_UI_PLOT_POINT");
+    plot.labels.push_back({p.Sd, p.Sa,
+                           FormatText("%s\nSd = %.4g %s, Sa = %.4g g", title.c_str(), p.Sd,
+                                      LengthUnit(e).c_str(), p.Sa),
+                           PLOT_MARKER::Circle, true});
 }
 
 /// Other points where demand equals capacity, additional steps and points.
@@ -89,11 +107,11 @@ void AddExtras(T_PLOT& plot, const T_PUSH_EVALUATION& e)
     };
     for (const T_PERF_POINT& p : e.allPoints) {
         if (!isAnswer(p))
-            plot.labels.push_back({p.Sd, p.Sa, "demand = capacity", PLOT_MARKER::Triangle, false});
+            plot.labels.push_back(
+                {p.Sd, p.Sa, Text("IDS_QM_UI_PLOT_BALANCED"), PLOT_MARKER::Triangle, false});
     }
     for (const T_ADDITIONAL_STEP& s : e.additionalSteps)
-        plot.labels.push_back(
-            {s.Sd, s.Sa, FormatText("step %d", s.step), PLOT_MARKER::Plus, false});
+        plot.labels.push_back({s.Sd, s.Sa, PlotStepText(s.step), PLOT_MARKER::Plus, false});
     for (const T_ADDITIONAL_POINT& p : e.additionalPoints) {
         if (p.point)
             plot.labels.push_back(
@@ -105,8 +123,8 @@ void AddTargets(T_PLOT& plot, const T_PUSH_EVALUATION& e)
 {
     if (e.bilinear) {
         const T_BILINEAR& b = *e.bilinear;
-        AddAdrsCurve(plot, "Bilinear capacity", {{0.0, b.dy, b.du}, {0.0, b.ay, b.au}},
-                     PLOT_LINE::DashDot, 1.6, kGreen);
+        AddAdrsCurve(plot, Text("IDS_QM_UI_PLOT_BILINEAR").c_str(),
+                     {{0.0, b.dy, b.du}, {0.0, b.ay, b.au}}, PLOT_LINE::DashDot, 1.6, kGreen);
     }
     for (const T_GUIDE_LINE& line : e.guideLines) {
         T_PLOT_GUIDE g;
@@ -145,43 +163,59 @@ void SetRanges(T_PLOT& plot, const T_PUSH_EVALUATION& e)
     }
 }
 
-void AddNotes(T_PLOT& plot, const T_PUSH_EVALUATION& e)
+} // namespace
+
+std::string PlotStepText(int step)
 {
-    plot.notes.push_back("Outcome: " + OutcomeName(e.outcome));
+    return MMSGFunction::Format("IDS_QM_UI_PLOT_STEP", {std::to_string(step)});
+}
+
+std::string PlotSubtitle(const T_PUSH_EVALUATION& e)
+{
+    std::string method = MethodName(e.eval.method);
+    if (!e.IsTarget())
+        method +=
+            " " + MMSGFunction::Format("IDS_QM_UI_PLOT_PROCEDURE", {std::string(1, e.procedure)});
+    return MMSGFunction::Format("IDS_QM_UI_PLOT_SUBTITLE", {method, e.eval.push, e.eval.spectrum});
+}
+
+void AddEvaluationNotes(T_PLOT& plot, const T_PUSH_EVALUATION& e)
+{
+    plot.notes.push_back(Text("IDS_QM_UI_PLOT_OUTCOME") + ": " + OutcomeName(e.outcome));
     if (e.point) {
         plot.notes.push_back(FormatText("D = %.5g %s", e.point->D, LengthUnit(e).c_str()));
         plot.notes.push_back(FormatText("V = %.5g %s", e.point->V, ForceUnit(e).c_str()));
         plot.notes.push_back(FormatText("T_eff = %.4g s", e.point->Teff));
         if (e.point->damping)
-            plot.notes.push_back(FormatText("Effective damping = %.4g %%", *e.point->damping));
-        plot.notes.push_back(FormatText("Trials: %zu", e.trace.size()));
+            plot.notes.push_back(
+                ValueText(Text("IDS_QM_UI_PLOT_DAMPING"), *e.point->damping, "%.4g", "%"));
+        plot.notes.push_back(Text("IDS_QM_UI_PUSH_TRIALS") + ": " + std::to_string(e.trace.size()));
     }
     for (const T_LIMIT_ROW& row : e.limitStates) {
         if (row.demand)
-            plot.notes.push_back(FormatText("%s demand = %.4g %s", row.name.c_str(), *row.demand,
-                                            LengthUnit(e).c_str()));
+            plot.notes.push_back(
+                ValueText(MMSGFunction::Format("IDS_QM_UI_PLOT_STATE_DEMAND", {row.name}),
+                          *row.demand, "%.4g", LengthUnit(e)));
     }
     plot.notes.push_back(FormatText("Gamma = %.4g, m* = %.5g %s s2/%s", e.factors.gamma, e.mStar,
                                     ForceUnit(e).c_str(), LengthUnit(e).c_str()));
 }
 
-} // namespace
-
 T_PLOT EvaluationPlot(const T_PUSH_EVALUATION& e)
 {
     T_PLOT plot;
     plot.title = e.eval.name;
-    plot.subtitle = std::string(MethodName(e.eval.method)) +
-                    (e.IsTarget() ? "" : std::string(" procedure ") + e.procedure) + ", pushover " +
-                    e.eval.push + ", spectrum " + e.eval.spectrum;
-    plot.x.title = "Spectral displacement Sd (" + LengthUnit(e) + ")";
-    plot.y.title = "Spectral acceleration Sa (g)";
+    plot.subtitle = PlotSubtitle(e);
+    plot.x.title = Text("IDS_QM_UI_PLOT_SD") + " (" + LengthUnit(e) + ")";
+    plot.y.title = Text("IDS_QM_UI_PLOT_SA") + " (g)";
     AddDemands(plot, e);
-    AddAdrsCurve(plot, "Working demand of the last trial", e.working, PLOT_LINE::DashDot, 1.4,
+    AddAdrsCurve(plot, Text("IDS_QM_UI_PLOT_WORKING").c_str(), e.working, PLOT_LINE::DashDot, 1.4,
                  kGray);
-    AddAdrsCurve(plot, "Reduced demand", e.reduced, PLOT_LINE::Dash, 1.8, kRed);
-    AddAdrsCurve(plot, "Capacity", e.capacity, PLOT_LINE::Solid, 2.6, kBlack);
-    AddAdrsCurve(plot, "Locus of demand points", e.locus, PLOT_LINE::Dot, 1.6, kGreen,
+    AddAdrsCurve(plot, Text("IDS_QM_UI_PLOT_REDUCED").c_str(), e.reduced, PLOT_LINE::Dash, 1.8,
+                 kRed);
+    AddAdrsCurve(plot, Text("IDS_QM_UI_PLOT_CAPACITY").c_str(), e.capacity, PLOT_LINE::Solid, 2.6,
+                 kBlack);
+    AddAdrsCurve(plot, Text("IDS_QM_UI_PLOT_LOCUS").c_str(), e.locus, PLOT_LINE::Dot, 1.6, kGreen,
                  PLOT_MARKER::Triangle);
     AddTargets(plot, e);
     AddTrials(plot, e);
@@ -190,6 +224,6 @@ T_PLOT EvaluationPlot(const T_PUSH_EVALUATION& e)
     AddRadial(plot, "T0", PeriodOfFirstStep(e), e.factors.gravity);
     if (e.point) AddRadial(plot, "T_eff", e.point->Teff, e.factors.gravity);
     SetRanges(plot, e);
-    AddNotes(plot, e);
+    AddEvaluationNotes(plot, e);
     return plot;
 }

@@ -7,3 +7,9 @@
 /// Capacity, elastic demand, reduced demand, locus, trials, performance point or limit states,
 /// initial-stiffness and effective-period lines, with units, legend and results below.
 T_PLOT EvaluationPlot(const T_PUSH_EVALUATION& e);
+
+// Parts that other pictures of an evaluation share.
+std::string PlotStepText(int step);
+std::string PlotSubtitle(const T_PUSH_EVALUATION& e);
+/// The results below the picture.
+void AddEvaluationNotes(T_PLOT& plot, const T_PUSH_EVALUATION& e);

@@ -40,6 +40,7 @@ void CFormField::ShowState()
         label->setVisible(on);
         label->setEnabled(usable);
     }
+    if (unit) unit->setVisible(on);
     if (!widget) return;
     widget->setVisible(on);
     widget->setEnabled(usable);

@@ -23,6 +23,7 @@ public:
     std::function<bool()> shown;   // empty: always
 
     QLabel* label = nullptr;
+    QLabel* unit = nullptr;
     QWidget* widget = nullptr;
 
     /// Shows the model's value, unless the person is changing it.

@@ -162,11 +162,8 @@ public:
     {
         widget = m_view;
     }
-    void Show() override
-    {
-        T_PLOT plot = m_plot();
-        if (plot != m_view->Plot()) m_view->SetPlot(std::move(plot));
-    }
+    /// A part that the person has zoomed to stays.
+    void Show() override { m_view->UpdatePlot(m_plot()); }
 
 private:
     std::function<T_PLOT()> m_plot;

@@ -93,11 +93,11 @@ void CFormView::Columns()
     NextColumn();
 }
 
-void CFormView::NextColumn()
+void CFormView::NextColumn(int stretch)
 {
     m_boxes.pop_back();
     auto* column = new QWidget(this);
-    m_boxes.back().columns->addWidget(column);
+    m_boxes.back().columns->addWidget(column, stretch);
     m_boxes.push_back(NewBox(column));
     m_boxes.back().grid->setContentsMargins(0, 0, 0, 0);
 }
@@ -106,6 +106,12 @@ void CFormView::EndColumns()
 {
     m_boxes.pop_back();
     m_boxes.pop_back();
+}
+
+void CFormView::Space()
+{
+    T_BOX& box = m_boxes.back();
+    box.grid->setRowStretch(box.row++, 1);
 }
 
 void CFormView::Page(TextFn title, std::function<bool()> shown)
@@ -150,6 +156,7 @@ CFormField& CFormView::Add(TextFn caption, std::unique_ptr<CFormField> field, co
         if (unit) {
             auto* label = new QLabel(this);
             box.grid->addWidget(label, box.row, kUnit);
+            field->unit = label;
             m_titles.push_back({unit, [label](const QString& t) { label->setText(t); }});
         }
         box.grid->setRowStretch(box.row++, Grows(widget) ? 1 : 0);

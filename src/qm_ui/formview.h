@@ -26,11 +26,15 @@ public:
     void EndGroup();
     /// Side by side: Columns, fields, NextColumn, fields, EndColumns.
     void Columns();
-    void NextColumn();
+    /// stretch above 0: this column takes the width that is left.
+    void NextColumn(int stretch = 0);
     void EndColumns();
     /// Pages of a tab: Page ... Page ... EndPages. `shown` as for fields.
     void Page(TextFn title, std::function<bool()> shown = {});
     void EndPages();
+
+    /// Room that is left goes here: what follows is at the bottom.
+    void Space();
 
     // ---- fields; unit: text after the widget ----
     CFormField& Number(TextFn caption, T_BINDING<double> binding, TextFn unit = {});

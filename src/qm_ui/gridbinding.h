@@ -3,6 +3,7 @@
 
 #include "qm_rps/hingenumbergrid.h"
 #include "qm_rps/recordgrid.h"
+#include "qm_rps/texttable.h"
 #include "qm_ui/binding.h"
 
 struct T_GRID_COLUMN {
@@ -39,3 +40,5 @@ struct T_GRID_BINDING {
 T_GRID_BINDING GridOf(CRecordGrid& grid);
 /// The whole of a number grid of the models. The grid must outlive the view.
 T_GRID_BINDING GridOf(CHingeNumberGrid& grid);
+/// A table that is only read, made again with each refresh; its number of columns stays.
+T_GRID_BINDING GridOf(std::function<T_TEXT_TABLE()> make);

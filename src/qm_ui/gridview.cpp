@@ -84,10 +84,22 @@ CGridView::CGridView(T_GRID_BINDING binding, ChangedFn changed, QWidget* parent)
 void CGridView::Refresh()
 {
     m_model->Refresh();
+    if (isVisible()) FitColumns();
+    FollowChoice();
+}
+
+void CGridView::FitColumns()
+{
     constexpr int kMeasured = 200; // columns of large tables are measured by their first rows
     horizontalHeader()->setResizeContentsPrecision(kMeasured);
     resizeColumnsToContents();
-    FollowChoice();
+}
+
+/// Tables on pages behind are measured when they come to the front.
+void CGridView::showEvent(QShowEvent* event)
+{
+    QTableView::showEvent(event);
+    FitColumns();
 }
 
 void CGridView::FollowChoice()

@@ -23,10 +23,12 @@ public:
 
 protected:
     void keyPressEvent(QKeyEvent* event) override;
+    void showEvent(QShowEvent* event) override;
 
 private:
     T_GRID_RANGE ChosenRange() const;
     int PasteCells(const QString& text, const T_GRID_RANGE& from);
+    void FitColumns();
     void FollowChoice();
 
     CGridModel* m_model;

@@ -1,6 +1,7 @@
 #include "qm_ui/plotfile.h"
 
 #include "qm_ui/plot.h"
+#include "qm_ui/plotdrawing.h"
 
 T_DRAWING DrawingOf(const T_PLOT& plot)
 {

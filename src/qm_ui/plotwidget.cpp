@@ -38,9 +38,15 @@ CPlotWidget::CPlotWidget(QWidget* parent) : QWidget(parent)
     setSizePolicy(QSizePolicy::Expanding, QSizePolicy::Expanding);
 }
 
+void CPlotWidget::SetSizeHint(const QSize& size)
+{
+    m_wanted = size;
+    updateGeometry();
+}
+
 QSize CPlotWidget::sizeHint() const
 {
-    return {960, 640};
+    return m_wanted;
 }
 
 QSize CPlotWidget::minimumSizeHint() const
@@ -53,6 +59,16 @@ void CPlotWidget::SetPlot(T_PLOT plot)
     m_plot = std::move(plot);
     m_grab.reset();
     SetView({});
+}
+
+void CPlotWidget::UpdatePlot(T_PLOT plot)
+{
+    if (plot == m_plot) return;
+    const bool sameAxes = plot.x.title == m_plot.x.title && plot.y.title == m_plot.y.title &&
+                          plot.x.log == m_plot.x.log && plot.y.log == m_plot.y.log;
+    if (!sameAxes) return SetPlot(std::move(plot));
+    m_plot = std::move(plot);
+    Forget();
 }
 
 void CPlotWidget::SetView(const T_PLOT_VIEW& view)

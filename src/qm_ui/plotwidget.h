@@ -7,6 +7,7 @@
 #include <QPixmap>
 #include <QPoint>
 #include <QPointF>
+#include <QSize>
 #include <QWidget>
 
 #include <cstddef>
@@ -21,6 +22,8 @@ public:
     explicit CPlotWidget(QWidget* parent = nullptr);
 
     void SetPlot(T_PLOT plot); // shows the whole plot
+    /// The same picture with other values: while the axes are the same, the part on show stays.
+    void UpdatePlot(T_PLOT plot);
     [[nodiscard]] const T_PLOT& Plot() const { return m_plot; }
     [[nodiscard]] const T_PLOT_VIEW& View() const { return m_view; }
     void SetView(const T_PLOT_VIEW& view);
@@ -32,6 +35,8 @@ public:
     /// Empty when no point is near.
     [[nodiscard]] QString ReadOut(QPointF pos);
 
+    /// The size that a window gives it at first, 960 x 640 otherwise.
+    void SetSizeHint(const QSize& size);
     [[nodiscard]] QSize sizeHint() const override;
     [[nodiscard]] QSize minimumSizeHint() const override;
 
@@ -62,6 +67,7 @@ private:
     [[nodiscard]] QString HitText(const T_HIT& hit) const;
     void DrawReadOut(QPainter& painter);
 
+    QSize m_wanted{960, 640};
     T_PLOT m_plot;
     T_PLOT_VIEW m_view;
     std::optional<T_PLOT_LAYOUT> m_layout; // empty: to be computed

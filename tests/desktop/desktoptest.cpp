@@ -12,6 +12,7 @@
 #include <QLocale>
 #include <QMessageBox>
 #include <QMouseEvent>
+#include <QPointer>
 #include <QPushButton>
 #include <QSettings>
 #include <QStandardPaths>
@@ -86,10 +87,15 @@ CAnswers::~CAnswers()
 void CAnswers::Look()
 {
     QWidget* window = QApplication::activeModalWidget();
-    if (!window || !window->isVisible()) return;
+    if (!window || !window->isVisible() || window == m_at) return;
     if (auto* box = qobject_cast<QMessageBox*>(window)) m_texts << box->text();
     if (m_next < m_steps.size()) {
-        m_steps[m_next++](*window);
+        // Later, so that the timer goes on to answer what comes up over the window meanwhile.
+        QTimer::singleShot(0, this, [this, step = m_next++, before = m_at, at = QPointer(window)] {
+            if (at) m_steps[step](*at);
+            m_at = before;
+        });
+        m_at = window;
         return;
     }
     ADD_FAILURE() << "unexpected window: " << window->windowTitle().toStdString() << ": "

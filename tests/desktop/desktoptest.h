@@ -53,6 +53,7 @@ private:
     void Look();
     std::vector<STEP> m_steps;
     std::size_t m_next = 0;
+    QWidget* m_at = nullptr; // window whose step is under way
     QTimer* m_timer;
 };
 

@@ -1,3 +1,365 @@
 #include "desktoptest.h"
-
+#include "explorerpane.h"
 #include "pushovertools.h"
+#include "pushoverwindow.h"
+
+#include "qm_rps/pushovercurvedampparamuser.h"
+#include "qm_ui/plotwidget.h"
+
+#include <QCheckBox>
+#include <QComboBox>
+#include <QFile>
+#include <QFileInfo>
+#include <QLabel>
+#include <QLineEdit>
+#include <QProcess>
+#include <QRegularExpression>
+#include <QSlider>
+#include <QSpinBox>
+
+using namespace desktop_test;
+
+namespace {
+
+constexpr const char* kFrame = "rc-frame-3-storey";
+
+QByteArray Contents(const QString& path)
+{
+    QFile file(path);
+    return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
+}
+
+/// Runs the command line program; what it printed.
+QByteArray Program(const QStringList& arguments)
+{
+    QProcess process;
+    process.start(QM_RPS_PROGRAM, arguments);
+    EXPECT_TRUE(process.waitForFinished());
+    EXPECT_EQ(0, process.exitCode()) << process.readAllStandardError().toStdString();
+    return process.readAllStandardOutput();
+}
+
+/// The first number after a text, on from another one.
+double NumberAfter(const QByteArray& text, const char* from, const char* name)
+{
+    const QString rest = QString::fromUtf8(text.mid(text.indexOf(from)));
+    const QRegularExpression pattern(QStringLiteral("\"%1\": ([-0-9.eE+]+)").arg(name));
+    return pattern.match(rest).captured(1).toDouble();
+}
+
+class PushoverWindows : public DesktopTest {
+protected:
+    void OpenCurve(const char* example = kFrame)
+    {
+        ASSERT_TRUE(Open(example));
+        Run("IDS_QM_UI_PUSH_CURVE");
+        m_window = &CPushOverWindow::Show(m_main->Desktop());
+        Settle();
+    }
+    CPushOverCurveEdit& Model() { return m_window->Model(); }
+    QWidget* Field(const char* name)
+    {
+        CFormField* field = m_window->Form().Find(name);
+        return field ? field->widget : nullptr;
+    }
+    bool IsMarked(const char* name) { return m_window->Form().Find(name)->IsMarked(); }
+    CPlotWidget& Plot() { return *dynamic_cast<CPlotWidget*>(Field("plot")); }
+    QString Refusal() { return qobject_cast<QLabel*>(Field("refusal"))->text(); }
+    bool HasLabel(const char* text)
+    {
+        return std::ranges::any_of(Plot().Plot().labels,
+                                   [&](const T_PLOT_LABEL& l) { return l.text == text; });
+    }
+
+    CPushOverWindow* m_window = nullptr;
+};
+
+/// Clicks the field of a dialog's form.
+void ClickOn(CDialogWindow& dialog, const char* name)
+{
+    CFormField* field = dialog.Form().Find(name);
+    ASSERT_NE(nullptr, field) << name;
+    Click(field->widget);
+}
+
+/// Saves from the preview and closes it.
+CAnswers::STEP SaveText()
+{
+    return [](QWidget& window) {
+        auto* dialog = dynamic_cast<CDialogWindow*>(&window);
+        ASSERT_NE(nullptr, dialog);
+        ClickOn(*dialog, "save");
+        dialog->reject();
+    };
+}
+
+} // namespace
+
+// Every evaluation method, from File > Open to files on disk, against the command line program.
+TEST_F(PushoverWindows, TheWholeJobGivesTheReportOfTheCommandLine)
+{
+    struct T_JOB {
+        const char* stored; // opened, then:
+        int spectrum;       // chosen in the list
+        const char* same;   // evaluation of the case file with these settings
+    };
+    const T_JOB jobs[] = {{"PX_MODE1 ATC-40 B", 1, "PX_MODE1 ATC-40 B strong"},
+                          {"PX_MODE1 FEMA440 A", 1, "PX_MODE1 FEMA440 A"},
+                          {"PX_MODE1 EC8", 2, "PX_MODE1 EC8"},
+                          {"PX_UNIFORM NTC2018", 3, "PX_UNIFORM NTC2018"}};
+    AnswerFileName(Example(kFrame));
+    Run("IDS_QM_UI_OPEN");
+    Run("IDS_QM_UI_PUSH_CURVE");
+    m_window = &CPushOverWindow::Show(m_main->Desktop());
+    for (const T_JOB& job : jobs) {
+        const auto names = Model().Evaluations();
+        const auto it = std::ranges::find(names, job.stored);
+        ASSERT_NE(names.end(), it);
+        ChooseIndex(Field("open"), static_cast<int>(it - names.begin()) + 1);
+        ASSERT_EQ(job.stored, Model().Result().eval.name);
+        ChooseIndex(Field("spectrum"), job.spectrum);
+        AnswerFileName(File("window")); // .txt is appended
+        {
+            CAnswers answers({SaveText()});
+            Click(Field("report"));
+        }
+        const QByteArray json = Program({"evaluate", Example(kFrame), "--only", job.same, "--json",
+                                         "-", "--report", File("program.txt")});
+        const QByteArray report = Contents(File("window.txt"));
+        EXPECT_GT(report.size(), 1000) << job.same;
+        EXPECT_EQ(Contents(File("program.txt")), report) << job.same;
+        const T_PUSH_EVALUATION& e = Model().Result();
+        EXPECT_EQ(NumberAfter(json, "\"factors\"", "gamma"), e.factors.gamma);
+        if (e.IsTarget()) {
+            EXPECT_EQ(NumberAfter(json, "\"limit_states\"", "demand"), e.limitStates[0].demand);
+            continue;
+        }
+        ASSERT_TRUE(e.point) << job.same;
+        for (const auto& [name, value] : {std::pair("D", e.point->D), std::pair("V", e.point->V),
+                                          std::pair("T_eff", e.point->Teff)})
+            EXPECT_EQ(NumberAfter(json, "\"performance_point\"", name), value) << name;
+    }
+    EXPECT_FALSE(m_main->Doc().Data().IsModified()); // nothing was stored silently
+}
+
+TEST_F(PushoverWindows, TypingIsEvaluatedAtOnceAndWrongInputKeepsTheLastPicture)
+{
+    OpenCurve();
+    const double first = Model().Result().point->Sd;
+    Type(Field("elasticDamping"), "8");
+    const double softer = Model().Result().point->Sd;
+    EXPECT_LT(softer, first);
+    EXPECT_EQ("", Model().Refusal());
+    const T_PLOT before = Plot().Plot();
+    for (const char* wrong : {"-1", "101", "x", ""}) {
+        Type(Field("elasticDamping"), wrong);
+        EXPECT_TRUE(IsMarked("elasticDamping")) << wrong;
+        EXPECT_EQ(before, Plot().Plot()) << wrong;
+        EXPECT_EQ(softer, Model().Result().point->Sd) << wrong;
+    }
+    Type(Field("elasticDamping"), "-1");
+    EXPECT_TRUE(Field("refusal")->isVisible());
+    EXPECT_TRUE(Refusal().contains("0 to 100"));
+    Type(Field("elasticDamping"), "5");
+    EXPECT_EQ(first, Model().Result().point->Sd);
+    EXPECT_FALSE(Field("refusal")->isVisible());
+    EXPECT_FALSE(IsMarked("elasticDamping"));
+}
+
+TEST_F(PushoverWindows, TrialsAreSteppedThroughOneAtATime)
+{
+    OpenCurve();
+    const int count = Model().TrialCount();
+    ASSERT_EQ(2, count);
+    auto* slider = Field("trial")->findChild<QSlider*>();
+    ASSERT_EQ(count, slider->maximum());
+    Plot().SetView({T_PLOT_RANGE{0.0, 5.0}, {}, {}}); // the person has zoomed in
+    for (int k = 1; k <= count; ++k) {
+        Key(slider, Qt::Key_Right);
+        EXPECT_EQ(k, Model().Trial());
+        EXPECT_TRUE(HasLabel(("trial " + std::to_string(k)).c_str()));
+        EXPECT_EQ(5.0, Plot().View().x->hi);
+        auto* table = qobject_cast<QTableView*>(Field("trials"));
+        EXPECT_EQ(k - 1, table->currentIndex().row());
+    }
+    Key(Field("trial")->findChild<QSpinBox*>(), Qt::Key_Down);
+    EXPECT_EQ(count - 1, Model().Trial());
+    auto* table = qobject_cast<QTableView*>(Field("trials"));
+    const double dpi = Model().Result().trace[0].dpi;
+    EXPECT_NEAR(dpi, table->model()->index(0, 0).data().toDouble(), 1e-5 * dpi);
+}
+
+// The picture and the fields that the method has follow the choice of the method.
+TEST_F(PushoverWindows, EveryMethodAndPlotTypeHasItsPicture)
+{
+    OpenCurve();
+    ChooseIndex(Field("method"), 2);
+    EXPECT_EQ(PUSH_METHOD::Ec8Opcm, Model().m_settings.method);
+    EXPECT_FALSE(Field("procedure")->isVisibleTo(m_window));
+    EXPECT_TRUE(Field("masonry")->isVisibleTo(m_window));
+    const auto lines = Plot().Plot().guides.size();
+    Click(Field("guideLines"));
+    EXPECT_GT(lines, 2U);
+    EXPECT_TRUE(Plot().Plot().guides.empty());
+    const char* const titles[] = {"Resultant Base Reaction (kips)", "Shear Coefficient",
+                                  "Shear Coefficient", "Load Factor"};
+    for (int type = 0; type < 4; ++type) {
+        ChooseIndex(Field("plotType"), type);
+        EXPECT_EQ(titles[type], Plot().Plot().y.title);
+        EXPECT_EQ(Model().Result().curve.x, Plot().Plot().series.at(0).x);
+    }
+    ChooseIndex(Field("method"), 1);
+    EXPECT_TRUE(Field("procedure")->isVisibleTo(m_window));
+    ASSERT_EQ(2, qobject_cast<QComboBox*>(Field("procedure"))->count());
+}
+
+TEST_F(PushoverWindows, PicturesAreExportedInEveryFormatAndBadNamesAreRefused)
+{
+    OpenCurve();
+    for (const char* name : {"a.svg", "a.pdf", "a.png", "a.jpg", "a.bmp"}) {
+        AnswerFileName(File(name));
+        Click(Field("picture"));
+        EXPECT_GT(QFileInfo(File(name)).size(), 1000) << name;
+    }
+    for (const QString& bad : {File("a.gif"), File("no folder/a.svg")}) {
+        AnswerFileName(bad);
+        CAnswers answers({CAnswers::Accept()});
+        Click(Field("picture"));
+        EXPECT_TRUE(answers.m_texts.value(0).contains(bad)) << bad.toStdString();
+    }
+    AnswerFileName(File("curve.txt"));
+    {
+        CAnswers answers({SaveText()});
+        Click(Field("curveFile"));
+    }
+    EXPECT_TRUE(Contents(File("curve.txt")).contains("step"));
+    EXPECT_FALSE(Contents(File("curve.txt")).contains("Performance Point"));
+    AnswerFileName(File("no folder/report"));
+    CAnswers answers({[](QWidget& window) {
+                          ClickOn(dynamic_cast<CDialogWindow&>(window), "save");
+                          dynamic_cast<CDialogWindow&>(window).reject();
+                      },
+                      CAnswers::Accept()});
+    Click(Field("report"));
+    EXPECT_TRUE(answers.m_texts.value(0).contains("can't be created"));
+}
+
+TEST_F(PushoverWindows, UserDampingIsAcceptedRefusedAndCancelled)
+{
+    OpenCurve();
+    ChooseIndex(Field("behavior"), 3);
+    const auto fill = [](const char* beta1, const char* beta2) {
+        return [=](CDialogWindow& dialog) {
+            Type(dialog.Form().Find("beta1")->widget, beta1);
+            Type(dialog.Form().Find("beta2")->widget, beta2);
+        };
+    };
+    {
+        CAnswers answers({CAnswers::Fill(fill("10", "30"), false), CAnswers::Reject()});
+        Click(Field("userDamping"));
+        EXPECT_EQ(std::nullopt, Model().m_settings.userDamping);
+    }
+    {
+        CAnswers answers({CAnswers::Fill(fill("30", "10")), CAnswers::Accept(), // the message
+                          CAnswers::Fill(fill("10", "30"))});
+        Click(Field("userDamping"));
+        EXPECT_TRUE(answers.m_texts.value(0).contains("beta1"));
+    }
+    ASSERT_TRUE(Model().m_settings.userDamping);
+    EXPECT_EQ(10.0, (*Model().m_settings.userDamping)[0]);
+    EXPECT_EQ(30.0, (*Model().m_settings.userDamping)[2]);
+    EXPECT_EQ(Model().m_settings.userDamping,
+              Model().Result().eval.userDamping); // evaluated with them
+}
+
+TEST_F(PushoverWindows, StoredEvaluationsAndStepsAreVisibleActions)
+{
+    OpenCurve();
+    const auto& model = m_main->Doc().Data().Model();
+    const auto count = model.evaluations.size();
+    Type(Field("name"), "mine");
+    ChooseIndex(Field("method"), 2);
+    EXPECT_FALSE(m_main->Doc().Data().IsModified());
+    Click(Field("store"));
+    ASSERT_EQ(count + 1, model.evaluations.size());
+    EXPECT_EQ("mine", model.evaluations.rbegin()->second.name);
+    EXPECT_TRUE(m_main->windowTitle().contains('*'));
+    Run("IDS_QM_UI_UNDO");
+    EXPECT_EQ(count, model.evaluations.size());
+    EXPECT_TRUE(model.poverSteps.empty());
+    Click(Field("storeSteps"));
+    EXPECT_EQ(1U, model.poverSteps.size());
+    Type(Field("name"), "");
+    CAnswers answers({CAnswers::Accept()});
+    Click(Field("store"));
+    EXPECT_TRUE(answers.m_texts.value(0).contains("name"));
+}
+
+TEST_F(PushoverWindows, AdditionalStepsAndPointsAreListedAndDrawn)
+{
+    OpenCurve();
+    for (const char* step : {"3", "40"}) {
+        Type(Field("addStepNumber"), step);
+        Click(Field("addStep"));
+    }
+    EXPECT_EQ(2U, Model().Result().additionalSteps.size());
+    EXPECT_TRUE(HasLabel("step 40"));
+    Type(Field("addStepNumber"), "100000");
+    {
+        CAnswers answers({CAnswers::Accept()});
+        Click(Field("addStep"));
+        EXPECT_TRUE(answers.m_texts.value(0).contains("100000"));
+    }
+    ChooseIndex(Field("addPointSpectrum"), 1);
+    Click(Field("addPoint"));
+    EXPECT_EQ(1U, Model().Result().additionalPoints.size());
+    EXPECT_TRUE(HasLabel("ATC strong") || !Model().Result().additionalPoints[0].point);
+    qobject_cast<QTableView*>(Field("steps"))->selectRow(0);
+    Click(Field("removeStep"));
+    ASSERT_EQ(1U, Model().Result().additionalSteps.size());
+    EXPECT_EQ(40, Model().Result().additionalSteps[0].step);
+}
+
+TEST_F(PushoverWindows, TheComparisonShowsEveryMethodAndIsExported)
+{
+    ASSERT_TRUE(Open(kFrame));
+    AnswerFileName(File("all.svg"));
+    const auto look = [](CDialogWindow& dialog) {
+        auto* table = qobject_cast<QTableView*>(dialog.Form().Find("table")->widget);
+        EXPECT_EQ(8, table->model()->rowCount());
+        const QString first = table->model()->index(7, 1).data().toString();
+        ChooseIndex(dialog.Form().Find("spectrum")->widget, 3);
+        EXPECT_NE(first, table->model()->index(7, 1).data().toString());
+        ClickOn(dialog, "picture");
+        dialog.reject();
+    };
+    CAnswers answers({CAnswers::Fill(look, false)});
+    Run("IDS_QM_UI_PUSH_COMPARE_ALL");
+    EXPECT_TRUE(Contents(File("all.svg")).contains("NTC2018 SLV"));
+}
+
+TEST_F(PushoverWindows, OneWindowFollowsTheDocumentAndTheLanguage)
+{
+    ASSERT_TRUE(Open(kFrame));
+    m_main->Explorer().Choose(EXPLORER_TABLE::Evaluations);
+    ASSERT_TRUE(OpenPushoverRecord(m_main->Desktop(), EXPLORER_TABLE::Evaluations, 6));
+    m_window = &CPushOverWindow::Show(m_main->Desktop());
+    EXPECT_EQ(m_window, &CPushOverWindow::Show(m_main->Desktop()));
+    EXPECT_EQ("PX_MODE1 EC8", Model().Result().eval.name);
+    Run("IDS_QM_UI_ITALIAN");
+    EXPECT_EQ("Curva pushover", m_window->windowTitle());
+    EXPECT_TRUE(QString::fromStdString(Plot().Plot().x.title).startsWith("Spostamento spettrale"));
+    Run("IDS_QM_UI_ENGLISH");
+    ASSERT_TRUE(Open("first-steps"));
+    (void)CPushOverWindow::Show(m_main->Desktop());
+    const auto& pushes = m_main->Doc().Data().Model().pushovers;
+    EXPECT_EQ(pushes.begin()->second.name, Model().Result().loadCase.name);
+    EXPECT_FALSE(OpenPushoverRecord(m_main->Desktop(), EXPLORER_TABLE::Nodes, 1));
+    // Enter takes a value and closes nothing.
+    auto* damping = qobject_cast<QLineEdit*>(Field("elasticDamping"));
+    damping->selectAll();
+    Key(damping, 0, "7");
+    Key(damping, Qt::Key_Return);
+    EXPECT_TRUE(m_window->isVisible());
+    EXPECT_EQ(7.0, Model().m_settings.elasticDamping);
+}

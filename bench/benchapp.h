@@ -1,0 +1,5 @@
+// The Qt application of the benchmarks that need one, without a screen.
+#pragma once
+
+/// Makes it with the first call.
+void NeedBenchApp();

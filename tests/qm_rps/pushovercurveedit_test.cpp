@@ -1,0 +1,266 @@
+#include "qm_rps/pushovercurveedit.h"
+
+#include "pushsample.h"
+#include "qm_rps/pushovercurvedampparamuser.h"
+
+#include <algorithm>
+#include <gtest/gtest.h>
+#include <limits>
+
+namespace {
+
+/// Elastic-perfectly plastic push with a constant demand of 0.2 g, which it meets while elastic.
+T_MODEL_CONTENT Plastic()
+{
+    T_MODEL_CONTENT c = ThreeMasses({0.03, 0.06, 0.09, 0.12}, {10, 10, 10, 10});
+    c.model.spectra[1] = {"U", T_SPFC_USER{{0, 4}, {0.2, 0.2}, {}}};
+    c.model.spectra[2] = {"low", T_SPFC_USER{{0, 4}, {0.1, 0.1}, {}}};
+    return c;
+}
+
+struct T_EDIT {
+    CDBDoc doc;
+    std::unique_ptr<CPushOverCurveEdit> edit;
+    explicit T_EDIT(const T_MODEL_CONTENT& content = Plastic())
+    {
+        doc.Data().Assign(content);
+        edit = std::make_unique<CPushOverCurveEdit>(doc);
+    }
+    CPushOverCurveEdit* operator->() { return edit.get(); }
+    bool Said(const char* key) const
+    {
+        return std::ranges::any_of(edit->Messages(), [&](const auto& m) { return m.key == key; });
+    }
+    bool HasSteps()
+    {
+        std::array<int, 3> s{};
+        return doc.Post().GetPoverInfo()->GetStepEC8(1, s) != 0;
+    }
+};
+
+/// Answers every question alike and takes the messages.
+class CSays : public zql::frx::IDialogView {
+public:
+    explicit CSays(bool yes) : m_yes(yes) {}
+    void ShowMessage(const std::string&, const std::string&) override {}
+    bool AskYesNo(const std::string&, const std::string&) override { return m_yes; }
+    int RunModal(zql::frx::MDialog&) override { return 0; }
+
+private:
+    bool m_yes;
+};
+
+const double kNan = std::numeric_limits<double>::quiet_NaN();
+
+} // namespace
+
+TEST(PushOverCurveEdit, StartsWithDefaultsThatEvaluate)
+{
+    T_EDIT edit;
+    EXPECT_EQ("PX", edit->m_settings.push);
+    EXPECT_EQ("U", edit->m_settings.spectrum);
+    ASSERT_TRUE(edit->Result().point);
+    // ATC-40 (8-9) at 5 per cent gives (3.21 - 0.68 ln 5)/2.12 of 0.2 g
+    EXPECT_NEAR(0.2 * (3.21 - 0.68 * std::log(5.0)) / 2.12, edit->Result().point->Sa, 1e-12);
+    EXPECT_EQ("", edit->Refusal());
+    EXPECT_FALSE(edit.doc.Data().IsModified());
+}
+
+// Settings that break a rule are refused at their field; the result on show stays.
+TEST(PushOverCurveEdit, RefusedSettingsKeepTheLastResultAndNameTheField)
+{
+    struct T_BAD {
+        const char* field;
+        void (*spoil)(T_EVAL_D&);
+    };
+    const T_BAD bad[] = {
+        {"push", [](T_EVAL_D& e) { e.push = "gone"; }},
+        {"spectrum", [](T_EVAL_D& e) { e.spectrum = ""; }},
+        {"procedure", [](T_EVAL_D& e) { e.procedure = 'C'; }},
+        {"elasticDamping", [](T_EVAL_D& e) { e.elasticDamping = -1.0; }},
+        {"elasticDamping", [](T_EVAL_D& e) { e.elasticDamping = 100.1; }},
+        {"elasticDamping", [](T_EVAL_D& e) { e.elasticDamping = kNan; }},
+        {"userDamping",
+         [](T_EVAL_D& e) {
+             e.userDamping = {40, 0.9, 30, 0.5};
+         }},
+        {"bilinear.secant",
+         [](T_EVAL_D& e) {
+             e.bilinear = T_EVAL_BILINEAR{{}, 0.0, 0.85, {}};
+         }},
+        {"bilinear.drop",
+         [](T_EVAL_D& e) {
+             e.bilinear = T_EVAL_BILINEAR{{}, 0.6, 1.01, {}};
+         }},
+    };
+    T_EDIT edit;
+    const T_EVAL_D good = edit->m_settings;
+    const double before = edit->Result().point->Sd;
+    for (const T_BAD& b : bad) {
+        edit->m_settings = good;
+        b.spoil(edit->m_settings);
+        edit->OnEdited();
+        ASSERT_EQ(1U, edit->Findings().size()) << b.field;
+        EXPECT_EQ(b.field, edit->Findings()[0].field);
+        EXPECT_NE(std::string::npos, edit->Refusal().find(edit->Findings()[0].text)) << b.field;
+        EXPECT_EQ(before, edit->Pictured().point->Sd) << b.field;
+        EXPECT_EQ(0, edit->OnStore()) << b.field;
+    }
+    edit->m_settings = good;
+    edit->OnEdited();
+    EXPECT_TRUE(edit->Findings().empty());
+    EXPECT_EQ("", edit->Refusal());
+}
+
+TEST(PushOverCurveEdit, ACurveWithoutSpectrumKeepsTheLastPictureButNotItsValues)
+{
+    T_MODEL_CONTENT c = Plastic();
+    c.model.pushovers[2] = PushX("P0", 3); // no results
+    T_EDIT edit(c);
+    edit->m_settings.push = "P0";
+    edit->OnEdited();
+    EXPECT_FALSE(edit->Result().point);
+    EXPECT_EQ("PX", edit->Pictured().eval.push);
+    EXPECT_NE("", edit->Refusal());
+    EXPECT_EQ("-", PushoverResultCells(edit->Result()).rows.at(1).at(1));
+}
+
+TEST(PushOverCurveEdit, AnotherMethodTakesAProcedureAndPlotThatItHas)
+{
+    T_EDIT edit;
+    edit->ChangeMethod(PUSH_METHOD::Fema440);
+    edit->m_settings.procedure = 'C';
+    edit->m_settings.plotType = 4;
+    edit->ChangeMethod(PUSH_METHOD::Atc40);
+    EXPECT_EQ(std::nullopt, edit->m_settings.procedure);
+    EXPECT_EQ(std::nullopt, edit->m_settings.plotType);
+    edit->m_settings.procedure = 'B';
+    edit->m_settings.plotType = 2; // not of a method
+    edit->ChangeMethod(PUSH_METHOD::Fema440);
+    EXPECT_EQ('B', edit->m_settings.procedure);
+    edit->ChangeMethod(PUSH_METHOD::Ec8Opcm);
+    EXPECT_EQ(std::nullopt, edit->m_settings.procedure);
+    EXPECT_EQ(2, edit->m_settings.plotType);
+    edit->OnEdited();
+    EXPECT_EQ("", edit->Refusal());
+}
+
+TEST(PushOverCurveEdit, StoringIsOneUndoableEditAndAsksBeforeItReplaces)
+{
+    T_EDIT edit;
+    edit->m_settings.name = "mine";
+    edit->m_settings.elasticDamping = 4.0;
+    ASSERT_EQ(1, edit->OnStore());
+    ASSERT_EQ(1U, edit.doc.Data().Model().evaluations.size());
+    EXPECT_EQ(edit->m_settings, edit.doc.Data().Model().evaluations.at(1));
+    edit->m_settings.elasticDamping = 3.0;
+    EXPECT_EQ(0, edit->OnStore()); // nobody to say yes
+    CSays yes(true), no(false);
+    edit->SetView(&no);
+    EXPECT_EQ(0, edit->OnStore());
+    EXPECT_EQ(4.0, edit.doc.Data().Model().evaluations.at(1).elasticDamping);
+    edit->SetView(&yes);
+    EXPECT_EQ(1, edit->OnStore());
+    EXPECT_EQ(3.0, edit.doc.Data().Model().evaluations.at(1).elasticDamping);
+    EXPECT_EQ(1, edit.doc.Undo().Undo());
+    EXPECT_EQ(4.0, edit.doc.Data().Model().evaluations.at(1).elasticDamping);
+    EXPECT_EQ(1, edit.doc.Undo().Undo());
+    EXPECT_TRUE(edit.doc.Data().Model().evaluations.empty());
+    edit->m_settings.name.clear();
+    EXPECT_EQ(0, edit->OnStore());
+    EXPECT_TRUE(edit.Said("IDS_QM_UI_PUSH_NO_NAME"));
+}
+
+TEST(PushOverCurveEdit, StepsAreStoredOnRequestOnly)
+{
+    T_EDIT edit;
+    EXPECT_EQ(0, edit->OnStoreSteps()); // ATC-40 has none
+    EXPECT_TRUE(edit.Said("IDS_QM_UI_PUSH_NO_STEPS"));
+    edit->ChangeMethod(PUSH_METHOD::Ec8Opcm);
+    edit->OnEdited();
+    EXPECT_EQ(1, edit->Result().result);
+    EXPECT_FALSE(edit.HasSteps());
+    EXPECT_FALSE(edit.doc.Data().IsModified());
+    EXPECT_EQ(1, edit->OnStoreSteps());
+    EXPECT_TRUE(edit.HasSteps());
+    EXPECT_TRUE(edit.doc.Data().IsModified());
+}
+
+TEST(PushOverCurveEdit, AdditionalStepsAndPointsComeAgainWithEachEvaluation)
+{
+    T_EDIT edit;
+    for (const int step : {2, 4, 2, 5}) { // one listed already, one that does not exist
+        edit->m_addStep = step;
+        edit->OnAddStep();
+    }
+    EXPECT_TRUE(edit.Said("IDS_PUSHOVER_Error___The_data_already_exist_"));
+    EXPECT_TRUE(edit.Said("IDS_QM_NO_SUCH_STEP"));
+    edit->m_addSpectrum = "low";
+    EXPECT_EQ(1, edit->OnAddPoint());
+    edit->m_settings.elasticDamping = 6.0;
+    edit->OnEdited();
+    ASSERT_EQ(2U, edit->Result().additionalSteps.size());
+    EXPECT_NEAR(0.06, edit->Result().additionalSteps[0].D, 1e-12);
+    ASSERT_EQ(1U, edit->Result().additionalPoints.size());
+    EXPECT_NEAR(edit->Result().point->Sa / 2, edit->Result().additionalPoints[0].point->Sa, 1e-9);
+    edit->OnRemoveStep(0);
+    ASSERT_EQ(1U, edit->Result().additionalSteps.size());
+    EXPECT_EQ(4, edit->Result().additionalSteps[0].step);
+    edit->OnRemovePoint(0);
+    EXPECT_TRUE(edit->Result().additionalPoints.empty());
+}
+
+TEST(PushOverCurveEdit, TheDocumentIsFollowedWhenItChanges)
+{
+    T_EDIT edit;
+    EXPECT_EQ(0, edit->OnDocumentChanged());
+    ASSERT_EQ(1, edit.doc.Edit().Begin("spectrum"));
+    ASSERT_EQ(1, edit.doc.Edit().Put(1, T_SPFC_D{"U", T_SPFC_USER{{0, 4}, {0.1, 0.1}, {}}}));
+    ASSERT_EQ(1, edit.doc.Edit().Commit());
+    const double before = edit->Result().point->Sa;
+    EXPECT_EQ(1, edit->OnDocumentChanged());
+    EXPECT_NEAR(before / 2, edit->Result().point->Sa, 1e-12);
+    T_MODEL_CONTENT other = Plastic();
+    other.model.pushovers[1].name = "PY";
+    edit.doc.Data().Assign(other);
+    EXPECT_EQ(1, edit->OnDocumentChanged());
+    EXPECT_EQ("PY", edit->m_settings.push);
+    edit.doc.Data().Assign({});
+    EXPECT_EQ(1, edit->OnDocumentChanged());
+    EXPECT_TRUE(edit->Pictured().capacity.Sd.empty());
+    EXPECT_NE("", edit->Refusal());
+}
+
+// Between the steps at 0.03 m with 10 kN and 0.06 m with 14 kN, at a quarter of the way.
+TEST(PushoverCells, APointIsPlacedOnTheCurvesOfOtherPlotTypes)
+{
+    T_MODEL_CONTENT c = ThreeMasses({0.03, 0.06, 0.09}, {10, 14, 15});
+    c.model.spectra[1] = Plastic().model.spectra[1];
+    T_EDIT edit(c);
+    struct T_CASE {
+        int plotType;
+        double x, y;
+    };
+    // the load factor is 0.5 per step
+    for (const T_CASE& t : {T_CASE{0, 0.0375, 11.0}, {3, 0.0375, 0.625}}) {
+        edit->m_settings.plotType = t.plotType;
+        edit->OnEdited();
+        const auto at = PlaceOnCurve(edit->Result(), 0.0375 / kGamma);
+        ASSERT_TRUE(at) << t.plotType;
+        EXPECT_NEAR(t.x, at->x, 1e-12) << t.plotType;
+        EXPECT_NEAR(t.y, at->y, 1e-12) << t.plotType;
+        EXPECT_FALSE(PlaceOnCurve(edit->Result(), 0.091 / kGamma)) << "beyond the curve";
+    }
+}
+
+TEST(CurveDampParamUser, TheCurveOfItsPictureIsLevelOutsideThePoints)
+{
+    CPushOverCurveDampParamUser points;
+    points.Data2Dlg({3, 5.0, 10, 0.9, 30, 0.5});
+    const auto curve = points.Curve();
+    ASSERT_EQ(4U, curve.size());
+    EXPECT_EQ(0.0, curve[0].x);
+    EXPECT_EQ(0.9, curve[0].y);
+    EXPECT_EQ(63.7, curve[3].x); // a rectangular loop
+    EXPECT_EQ(0.5, curve[3].y);
+}
