@@ -135,11 +135,38 @@ void CFormView::EndPages()
     m_boxes.pop_back();
 }
 
+void CFormView::Cells(std::vector<TextFn> heads)
+{
+    auto* table = new QWidget(this);
+    AddWide(table);
+    T_BOX box = NewBox(table);
+    box.grid->setContentsMargins(0, 0, 0, 0);
+    for (TextFn& head : heads) {
+        auto* label = new QLabel(table);
+        box.grid->addWidget(label, 0, box.cells);
+        box.grid->setColumnStretch(box.cells, box.cells > 0 ? 1 : 0);
+        m_titles.push_back({std::move(head), [label](const QString& t) { label->setText(t); }});
+        ++box.cells;
+    }
+    box.row = 1;
+    m_boxes.push_back(box);
+}
+
+void CFormView::EndCells()
+{
+    m_boxes.pop_back();
+}
+
 CFormField& CFormView::Add(TextFn caption, std::unique_ptr<CFormField> field, const TextFn& unit)
 {
     QWidget* const widget = field->widget;
     field->caption = std::move(caption);
-    if (!field->caption) {
+    if (T_BOX& table = m_boxes.back(); table.cells > 0) {
+        table.grid->addWidget(widget, table.row + table.cell / table.cells,
+                              table.cell % table.cells);
+        ++table.cell;
+        widget->setAccessibleName(Plain(field->caption));
+    } else if (!field->caption) {
         AddWide(widget);
     } else {
         T_BOX& box = m_boxes.back();

@@ -32,6 +32,11 @@ public:
     void Page(TextFn title, std::function<bool()> shown = {});
     void EndPages();
 
+    /// A table of fields: each one that follows stands in the next cell, row by row under the
+    /// heads. Captions are not shown; screen readers get them.
+    void Cells(std::vector<TextFn> heads);
+    void EndCells();
+
     // ---- fields; unit: text after the widget ----
     CFormField& Number(TextFn caption, T_BINDING<double> binding, TextFn unit = {});
     CFormField& Optional(TextFn caption, T_BINDING<std::optional<double>> binding,
@@ -79,6 +84,8 @@ private:
         int row = 0;
         QBoxLayout* columns = nullptr; // of a row of columns
         QTabWidget* tabs = nullptr;
+        int cells = 0; // columns of a table of fields
+        int cell = 0;  // the next one
     };
     struct T_TITLE {
         TextFn text;
