@@ -102,7 +102,7 @@ std::unique_ptr<QWidget> PartWindow(CMainWindow& main, std::function<void(DLG&)>
 std::unique_ptr<QWidget> SurfaceWindow(CMainWindow& main)
 {
     auto record = std::make_unique<T_YIELD_SURFACE>(ExampleSurface());
-    auto dlg = std::make_unique<CPO_HingeYieldPropDlgNew>(*record, SKEL_TYPE::Trilinear);
+    auto dlg = std::make_unique<CPO_HingeYieldPropDlgNew>(*record, SKEL_TYPE::Ec8);
     dlg->m_owner = OwnerOf(main, kConcrete);
     auto window = WindowOf(main, std::move(dlg));
     KeepWith(*window, std::move(record));

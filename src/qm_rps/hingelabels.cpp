@@ -45,7 +45,11 @@ std::string DeformHead(const std::string& name, HINGE_COMPONENT c, const T_HINGE
 std::string StiffnessHead(const std::string& name, HINGE_COMPONENT c, const T_HINGE_OWNER& owner)
 {
     const T_DIM s = StrengthDim(c), d = DeformDim(c, owner.type.definition);
-    return HingeHead(name, {s.force - d.force, s.length - d.length}, owner.units);
+    const T_DIM dim{s.force - d.force, s.length - d.length};
+    if (dim != kDimMass) return HingeHead(name, dim, owner.units);
+    // Force over length, which elsewhere is the unit of a mass.
+    return HingeHead(name, kDimNone, owner.units) + " (" + std::string(NameOf(owner.units.force)) +
+           "/" + std::string(NameOf(owner.units.length)) + ")";
 }
 
 const char* YieldDeformKey(HINGE_COMPONENT c, HINGE_DEFINITION definition)

@@ -93,9 +93,21 @@ void CFormView::Columns()
     NextColumn();
 }
 
+/// Fields stay together at the top where nothing grows.
+void CFormView::CloseColumn()
+{
+    if (QGridLayout* grid = m_boxes.back().grid) {
+        bool grows = false;
+        for (int row = 0; row < grid->rowCount(); ++row)
+            grows = grows || grid->rowStretch(row) > 0;
+        if (!grows) grid->setRowStretch(m_boxes.back().row, 1);
+    }
+    m_boxes.pop_back();
+}
+
 void CFormView::NextColumn()
 {
-    m_boxes.pop_back();
+    CloseColumn();
     auto* column = new QWidget(this);
     m_boxes.back().columns->addWidget(column);
     m_boxes.push_back(NewBox(column));
@@ -104,14 +116,14 @@ void CFormView::NextColumn()
 
 void CFormView::EndColumns()
 {
-    m_boxes.pop_back();
+    CloseColumn();
     m_boxes.pop_back();
 }
 
 void CFormView::Page(TextFn title, std::function<bool()> shown)
 {
     if (!m_boxes.back().tabs && m_boxes.size() > 1 && m_boxes[m_boxes.size() - 2].tabs)
-        m_boxes.pop_back(); // the page before
+        CloseColumn(); // the page before
     if (!m_boxes.back().tabs) {
         auto* tabs = new QTabWidget(this);
         AddWide(tabs);
@@ -131,7 +143,7 @@ void CFormView::Page(TextFn title, std::function<bool()> shown)
 
 void CFormView::EndPages()
 {
-    m_boxes.pop_back();
+    CloseColumn();
     m_boxes.pop_back();
 }
 

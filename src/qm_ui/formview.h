@@ -95,6 +95,7 @@ private:
         std::function<bool()> shown{};
     };
     T_BOX NewBox(QWidget* host);
+    void CloseColumn();
     void AddWide(QWidget* widget);
     CFormField& Add(TextFn caption, std::unique_ptr<CFormField> field, const TextFn& unit = {});
     void ShowTitles();

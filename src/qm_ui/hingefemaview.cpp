@@ -215,7 +215,7 @@ void BuildFema(CFormView& form, DLG& dlg)
         AddOptionsPage(form, page);
         form.EndPages();
         form.NextColumn();
-        form.Picture([page] { return Preview(page); });
+        form.Picture([page] { return Preview(page); }).name = page.prefix + "picture";
         form.EndColumns();
     });
     form.EndPages();

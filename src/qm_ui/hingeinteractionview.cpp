@@ -32,7 +32,7 @@ void AddStrengths(CFormView& form, SURFACE& dlg, const SURFACE::T_LEVEL& level)
     const auto force = [&](const char* name, const char* field, double& value) {
         form.Note([=] { return HingeHead(name, kDimForce, units); });
         form.Number(PlainLabel(name), Ref(value)).name = prefix + field;
-        form.Note({});
+        form.Note(PlainLabel(""));
     };
     const auto moments = [&](bool aboutY, bool largest) {
         T_YIELD_AXIS& axis = aboutY ? level.level->y : level.level->z;

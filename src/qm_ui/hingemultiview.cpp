@@ -196,9 +196,10 @@ void BuildMulti(CFormView& form, DLG& dlg)
         AddPage(form, {dlg, end, end == HINGE_END::J ? "J." : ""});
         form.NextColumn();
         form.Picture([&dlg, end, title] {
-            return HingeBackbonePlot(dlg.m_owner.type, dlg.Which(), *dlg.Curve(end),
-                                     zql::lib::MMSGFunction::GetValue(title));
-        });
+                return HingeBackbonePlot(dlg.m_owner.type, dlg.Which(), *dlg.Curve(end),
+                                         zql::lib::MMSGFunction::GetValue(title));
+            })
+            .name = std::string(end == HINGE_END::J ? "J." : "") + "picture";
         form.EndColumns();
     });
     form.EndPages();

@@ -71,8 +71,16 @@ void ChooseIndex(QWidget* box, int index)
         Key(list, i < index ? Qt::Key_Down : Qt::Key_Up);
 }
 
-CAnswers::CAnswers(std::vector<STEP> steps) : m_steps(std::move(steps)), m_timer(new QTimer(this))
+CAnswers::CAnswers(std::vector<STEP> steps) : m_steps(std::move(steps))
 {
+    StartTimer();
+}
+
+/// A timer does not fire while it is being handled: a step that opens a window needs another one.
+void CAnswers::StartTimer()
+{
+    if (m_timer) m_timer->stop();
+    m_timer = new QTimer(this);
     connect(m_timer, &QTimer::timeout, this, [this] { Look(); });
     m_timer->start(1);
 }
@@ -88,6 +96,7 @@ void CAnswers::Look()
     if (!window || !window->isVisible()) return;
     if (auto* box = qobject_cast<QMessageBox*>(window)) m_texts << box->text();
     if (m_next < m_steps.size()) {
+        StartTimer();
         m_steps[m_next++](*window);
         return;
     }
@@ -125,6 +134,7 @@ CAnswers::STEP CAnswers::Fill(std::function<void(CDialogWindow&)> fill, bool acc
     return [fill = std::move(fill), accept](QWidget& window) {
         auto* dialog = dynamic_cast<CDialogWindow*>(&window);
         ASSERT_NE(nullptr, dialog);
+        QApplication::setActiveWindow(dialog); // a window over another one, too, has the keyboard
         fill(*dialog);
         if (accept) dialog->accept();
     };

@@ -51,9 +51,10 @@ public:
 
 private:
     void Look();
+    void StartTimer();
     std::vector<STEP> m_steps;
     std::size_t m_next = 0;
-    QTimer* m_timer;
+    QTimer* m_timer = nullptr;
 };
 
 /// A main window on a fresh settings folder, with a model open.

@@ -31,7 +31,9 @@ TEST(HingeEditors, ElementListsAreReadWholeOrNotAtAll)
                             {"1.5", nullptr}}) {
         const auto ids = ParseElementList(c.text);
         ASSERT_EQ(c.shown != nullptr, ids.has_value()) << c.text;
-        if (ids) EXPECT_EQ(c.shown, ElementListText(*ids)) << c.text;
+        if (ids) {
+            EXPECT_EQ(c.shown, ElementListText(*ids)) << c.text;
+        }
     }
 }
 
