@@ -1,18 +1,75 @@
 #include "hingetools.h"
 
-void RegisterHingeViews(CViewFactory&) {}
+#include "qm_rps/hingedocument.h"
+#include "qm_ui/hingeviews.h"
 
-T_COMMANDS HingeCommands(T_DESKTOP&)
+namespace {
+
+constexpr const char* kMenu = "IDS_QM_UI_MENU_HINGES";
+
+void RunTypeList(T_DESKTOP& desktop)
 {
-    return {};
+    CPO_HingeTypeListDlg list(HingeTypesOf(desktop.doc));
+    list.SetView(&desktop.view);
+    (void)list.DoModal();
+    desktop.changed();
 }
 
-bool OpenHingeRecord(T_DESKTOP&, EXPLORER_TABLE, int)
+void RunHingeList(T_DESKTOP& desktop, int selected)
 {
-    return false;
+    CPushOverHingeListDlg list;
+    ConnectHinges(desktop.doc, list);
+    list.SetView(&desktop.view);
+    list.m_selected = selected;
+    (void)list.DoModal();
+    desktop.changed();
 }
 
-std::vector<T_WINDOW_EXAMPLE> HingeWindowExamples()
+void RunTable(T_DESKTOP& desktop)
 {
-    return {};
+    CPushOverHingeDataType table;
+    ConnectHinges(desktop.doc, table);
+    table.SetView(&desktop.view);
+    if (!table.ChooseFirst()) return;
+    (void)table.DoModal();
+    desktop.changed();
+}
+
+void RunTypeEditor(T_DESKTOP& desktop, int key)
+{
+    CPO_HingeTypeListDlg list(HingeTypesOf(desktop.doc));
+    list.SetView(&desktop.view);
+    list.m_selected = key;
+    (void)list.OnModify();
+    desktop.changed();
+}
+
+} // namespace
+
+void RegisterHingeViews(CViewFactory& factory)
+{
+    for (const auto add :
+         {RegisterHingeListViews, RegisterHingeTypeView, RegisterHingeFemaViews,
+          RegisterHingeMultiView, RegisterHingeEuroView, RegisterHingeInteractionViews,
+          RegisterHingeLengthViews, RegisterHingeStrengthViews})
+        add(factory);
+}
+
+T_COMMANDS HingeCommands(T_DESKTOP& desktop)
+{
+    return {{kMenu, "IDS_QM_UI_HINGE_TYPES", "Ctrl+Shift+H", [&desktop] { RunTypeList(desktop); }},
+            {kMenu, "IDS_QM_UI_HINGES_GENERATED", "Ctrl+Shift+G",
+             [&desktop] { RunHingeList(desktop, 0); }},
+            {kMenu, "IDS_QM_UI_HINGE_TABLE", "", [&desktop] { RunTable(desktop); }}};
+}
+
+bool OpenHingeRecord(T_DESKTOP& desktop, EXPLORER_TABLE table, int key)
+{
+    if (table == EXPLORER_TABLE::HingeTypes)
+        RunTypeEditor(desktop, key);
+    else if (table == EXPLORER_TABLE::Hinges)
+        RunHingeList(desktop, key);
+    else
+        return false;
+    return true;
 }

@@ -7,6 +7,7 @@ T_HINGE_CONTEXT HingeContextOf(CDBDoc& doc)
     context.altHysteresis = model.styp.alternativeHysteresis;
     context.strengthDegradation = model.styp.wallStrengthDegradation;
     context.gsd = context.gsdAllowed = model.styp.gsd;
+    context.units = model.styp.units;
     context.concreteCode = doc.Lib().GetConCodeName();
     context.steelCode = doc.Lib().GetStlCodeName();
     T_TABLE<T_SECT_D> sections = model.sections; // in SI

@@ -13,6 +13,7 @@ struct T_HINGE_CONTEXT {
     bool gsd = false;        // section-based curves are switched on ...
     bool gsdAllowed = false; // ... and the product allows them
     std::string concreteCode, steelCode;
+    T_UNITS units; // of the type
     /// In the units of the type; null: references and automatic strengths are not judged.
     std::shared_ptr<const CHingeSources> sources;
 };

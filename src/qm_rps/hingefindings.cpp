@@ -52,6 +52,18 @@ T_FINDING FindingOf(const T_RULE_HEAD& head, const T_PLACE& place)
     return f;
 }
 
+std::string PathOnPages(const T_FINDING& f)
+{
+    return f.end == HINGE_END::J ? "J." + f.field : f.field;
+}
+
+std::string PathInType(const T_FINDING& f)
+{
+    if (f.component < 0) return f.field;
+    return std::string(kComponentNames.at(static_cast<std::size_t>(f.component))) + "." +
+           PathOnPages(f);
+}
+
 const char* PageTitleKey(const T_HINGE_COMPONENT& c, HINGE_END end)
 {
     if (NeedsIJPages(c))

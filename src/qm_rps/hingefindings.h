@@ -62,6 +62,12 @@ struct T_RULE {
 /// The finding of a rule that is not kept.
 T_FINDING FindingOf(const T_RULE_HEAD& head, const T_PLACE& place);
 
+/// Where the finding stands in a hinge type: "My.sides.pos.B.strength", of the J-end
+/// "My.J.sides.pos.B.strength"; the field alone where it is of no component.
+std::string PathInType(const T_FINDING& f);
+/// Where it stands on the pages of one component: of the J-end "J.sides.pos.B.strength".
+std::string PathOnPages(const T_FINDING& f);
+
 /// The walker: appends what is not kept, in the order of the table.
 template <class DATA>
 void WalkRules(std::span<const T_RULE<DATA>> rules, const DATA& data, const T_PLACE& place,

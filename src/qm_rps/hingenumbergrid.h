@@ -17,6 +17,9 @@ public:
     virtual std::string RowHead(std::size_t row) const = 0;
     virtual std::string ColumnHead(std::size_t column) const = 0;
 
+    /// Field of a cell as findings name it; empty: none.
+    virtual std::string CellField(std::size_t, std::size_t) const { return {}; }
+
     /// Empty outside the grid.
     std::string CellText(std::size_t row, std::size_t column) const;
 

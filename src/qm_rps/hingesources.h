@@ -23,6 +23,7 @@ public:
     }
 
     const T_TABLE<T_SECT_D>& Sections() const { return m_sections; }
+    const T_TABLE<T_MATL_D>& Materials() const { return m_materials; }
     /// Null where there is none of that key.
     const T_SECT_D* Section(int key) const;
     const T_MATL_D* Material(int key) const;

@@ -2,12 +2,13 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_db/hingerecords.h"
+#include "qm_rps/hingelabels.h"
 
 class CPO_HingeAlphaYSpanDlg : public zql::frx::MDialog {
 public:
-    bool m_auto = true;  // span from the member
-    double m_span = 0.0; // length
+    T_HINGE_OWNER m_owner; // for units
+    bool m_auto = true;    // span from the member
+    double m_span = 0.0;   // length
 
     void Data2Dlg(const T_HINGE_LENGTH& data);
     /// Automatic: the flag is stored and the span stays as it was; else flag and span.

@@ -3,10 +3,11 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_db/hingerecords.h"
+#include "qm_rps/hingelabels.h"
 
 class CPO_HingeLengthMPhiDlg : public zql::frx::MDialog {
 public:
+    T_HINGE_OWNER m_owner; // for units
     using T_BLOCKS = T_ENDS<std::array<double, 6>>;
 
     /// Both blocks, whole.
@@ -16,6 +17,8 @@ public:
     /// The length entered for My is the length of every component at that end.
     void OnEnChangeMy_I(double length);
     void OnEnChangeMy_J(double length);
+    /// An entry of any component: that of My as above, another one for itself.
+    void OnEnChange(HINGE_COMPONENT c, HINGE_LOCATION end, double length);
 
 private:
     T_BLOCKS m_blocks;

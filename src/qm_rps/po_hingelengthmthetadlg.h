@@ -2,10 +2,11 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_db/hingerecords.h"
+#include "qm_rps/hingelabels.h"
 
 class CPO_HingeLengthMThetaDlg : public zql::frx::MDialog {
 public:
+    T_HINGE_OWNER m_owner;     // for units
     T_ENDS<double> m_My, m_Mz; // length, or fraction of the member's length
     bool m_relative = false;
 

@@ -3,9 +3,12 @@
 #pragma once
 
 #include "qm_rps/hingedialog.h"
+#include "qm_rps/hingelabels.h"
 
 class CPO_HingeMasonryDlg : public CHingeDialog {
 public:
+    T_HINGE_OWNER m_owner; // for titles and units
+
     T_MASONRY_HINGE m_masonry;
 
     void Data2Dlg(const T_MASONRY_HINGE& data) { m_masonry = data; }

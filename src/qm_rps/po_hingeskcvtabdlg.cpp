@@ -196,6 +196,11 @@ T_SKEL_MULTI* CPO_HingeSkcvTabDlg::Curve(HINGE_END end)
     return std::get_if<T_SKEL_MULTI>(j ? &m_data.curves.J : &m_data.curves.I);
 }
 
+void CPO_HingeSkcvTabDlg::OnEdited()
+{
+    m_data = MirroredComponent(m_data);
+}
+
 std::vector<const char*> CPO_HingeSkcvTabDlg::PageTitles() const
 {
     return PageTitleKeys(m_data);

@@ -3,15 +3,21 @@
 #pragma once
 
 #include "qm_rps/hingedialog.h"
+#include "qm_rps/hingelabels.h"
 
 class CPO_HingeSkcvTabDlg : public CHingeDialog {
 public:
+    T_HINGE_OWNER m_owner; // for titles and units
+
     /// 1 done; 0 the component has other curves.
     [[nodiscard]] int Data2Dlg(HINGE_COMPONENT c, const T_HINGE_COMPONENT& data);
     /// Checks, then writes back, symmetric curves copied to the negative side. 0: `data` as it was.
     [[nodiscard]] int Dlg2Data(T_HINGE_COMPONENT& data);
 
     T_HINGE_COMPONENT& Component() { return m_data; }
+    HINGE_COMPONENT Which() const { return m_component; }
+    /// After each edit: the negative side of a symmetric curve follows the positive one.
+    void OnEdited();
     /// The curve of a page, or null before Data2Dlg.
     T_SKEL_MULTI* Curve(HINGE_END end);
     std::vector<const char*> PageTitles() const;

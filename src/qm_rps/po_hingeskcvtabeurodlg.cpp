@@ -1,5 +1,6 @@
 #include "qm_rps/po_hingeskcvtabeurodlg.h"
 
+#include "qm_rps/hingemeasure.h"
 #include "qm_rps/hingemirror.h"
 #include "qm_rps/hingesiderules.h"
 
@@ -26,6 +27,7 @@ int CPO_HingeSkcvTabEuroDlg::Data2Dlg(HINGE_COMPONENT c, const T_HINGE_COMPONENT
         return 0;
     m_component = c;
     m_data = data;
+    m_switches = {};
     return 1;
 }
 
@@ -42,9 +44,29 @@ T_SKEL_EC8* CPO_HingeSkcvTabEuroDlg::Curve(HINGE_END end)
     return std::get_if<T_SKEL_EC8>(j ? &m_data.curves.J : &m_data.curves.I);
 }
 
+void CPO_HingeSkcvTabEuroDlg::OnEdited()
+{
+    m_data = MirroredComponent(m_data);
+}
+
 std::vector<const char*> CPO_HingeSkcvTabEuroDlg::PageTitles() const
 {
     return PageTitleKeys(m_data);
+}
+
+int CPO_HingeSkcvTabEuroDlg::OnMeasureRdo(HINGE_END end, SKEL_MEASURE measure)
+{
+    T_SKEL_EC8* curve = Curve(end);
+    if (!curve) return 0;
+    if (curve->measure == measure) return 1;
+    const T_SKEL_EC8 was = *curve;
+    ConvertSides(curve->sides, measure);
+    curve->measure = measure;
+    std::optional<T_SWITCH>& last = m_switches[end == HINGE_END::J && !m_data.sameEnds ? 1 : 0];
+    if (last && last->before.measure == measure)
+        RestoreSides(curve->sides, was.sides, last->after.sides, last->before.sides);
+    last = T_SWITCH{was, *curve};
+    return 1;
 }
 
 bool CPO_HingeSkcvTabEuroDlg::IsEurocodePair(const std::string& concreteCode,

@@ -3,18 +3,32 @@
 #pragma once
 
 #include "qm_rps/hingedialog.h"
+#include "qm_rps/hingelabels.h"
+
+#include <array>
+#include <optional>
 
 class CPO_HingeSkcvTabEuroDlg : public CHingeDialog {
 public:
+    T_HINGE_OWNER m_owner; // for titles and units
+
     /// 1 done; 0 the component has other curves.
     [[nodiscard]] int Data2Dlg(HINGE_COMPONENT c, const T_HINGE_COMPONENT& data);
     /// Checks, then writes back, symmetric curves mirrored. 0: `data` as it was.
     [[nodiscard]] int Dlg2Data(T_HINGE_COMPONENT& data);
 
     T_HINGE_COMPONENT& Component() { return m_data; }
+    HINGE_COMPONENT Which() const { return m_component; }
+    /// After each edit: the negative side of a symmetric curve follows the positive one.
+    void OnEdited();
     /// The curve of a page, or null before Data2Dlg.
     T_SKEL_EC8* Curve(HINGE_END end);
     std::vector<const char*> PageTitles() const;
+
+    /// Switches the measure of a page: ratios D/Dy against plastic deformations, by the yield
+    /// deformation of each side. Values that were not edited since the last switch come back digit
+    /// by digit. 1 done; 0 no such page.
+    [[nodiscard]] int OnMeasureRdo(HINGE_END end, SKEL_MEASURE measure);
 
     /// Yield-strength code of the calculation: "Eurocode2", "Eurocode2:04" or "Eurocode3",
     /// "Eurocode3:05".
@@ -27,4 +41,8 @@ public:
 private:
     HINGE_COMPONENT m_component = HINGE_COMPONENT::Fx;
     T_HINGE_COMPONENT m_data;
+    struct T_SWITCH {
+        T_SKEL_EC8 before, after; // around the last switch of the measure
+    };
+    std::array<std::optional<T_SWITCH>, 2> m_switches; // by end
 };

@@ -65,6 +65,12 @@ int CPO_HingeSkcvTabFemaAxialGrid::RemoveForce(double axial)
     return 1;
 }
 
+int CPO_HingeSkcvTabFemaAxialGrid::OnRemove()
+{
+    if (m_selected < 0 || m_selected >= static_cast<int>(m_rows.size())) return 0;
+    return RemoveForce(m_rows[static_cast<std::size_t>(m_selected)].axial);
+}
+
 int CPO_HingeSkcvTabFemaAxialGrid::Find(double axial) const
 {
     for (std::size_t i = 0; i < m_rows.size(); ++i)

@@ -2,12 +2,16 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_db/hingerecords.h"
+#include "qm_rps/hingelabels.h"
 
 #include <optional>
 
 class CPO_HingeSkcvTabFemaAxialGrid : public zql::frx::MDialog {
 public:
+    T_HINGE_OWNER m_owner; // for the unit
+    double m_entry = 0.0;  // force to be added
+    int m_selected = -1;   // chosen row; -1: none
+
     /// Forces, ascending, each with the index of the curve that it had in Data2Dlg (-1: new).
     struct T_ROW {
         double axial = 0.0;
@@ -26,6 +30,10 @@ public:
     [[nodiscard]] int AddForce(double axial);
     [[nodiscard]] int ChangeForce(double oldAxial, double axial);
     [[nodiscard]] int RemoveForce(double axial);
+
+    /// AddForce of the entry; RemoveForce of the chosen row (0 without a message: none is chosen).
+    [[nodiscard]] int OnAdd() { return AddForce(m_entry); }
+    [[nodiscard]] int OnRemove();
 
 private:
     int Find(double axial) const; // index or -1

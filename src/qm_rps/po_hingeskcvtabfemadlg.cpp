@@ -341,6 +341,7 @@ int CPO_HingeSkcvTabFemaDlg::OnAxialForceBtn(HINGE_COMPONENT c, HINGE_END end)
     if (!curve) return 0;
     CPO_HingeSkcvTabFemaAxialGrid grid;
     grid.SetView(View());
+    grid.m_owner = m_owner;
     grid.Data2Dlg(curve->curves);
     if (!grid.DoModal()) return 0;
     grid.Dlg2Data(curve->curves, curve->sides);

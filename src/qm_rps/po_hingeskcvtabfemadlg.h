@@ -7,6 +7,7 @@
 #pragma once
 
 #include "qm_rps/hingedialog.h"
+#include "qm_rps/hingelabels.h"
 
 #include <array>
 #include <optional>
@@ -15,6 +16,8 @@
 class CPO_HingeSkcvTabFemaDlg : public CHingeDialog {
 public:
     using T_ROW = std::array<double, 9>; // -E, -D, -C, -B, A, B, C, D, E
+
+    T_HINGE_OWNER m_owner; // for titles and units
 
     /// Takes a component that has FEMA curves. 1 done; 0 it has other curves.
     [[nodiscard]] int Data2Dlg(HINGE_COMPONENT c, const T_HINGE_COMPONENT& data);
@@ -87,6 +90,26 @@ public:
     /// The sides of the chosen axial force (index), or of the curve itself; null: no such curve.
     T_SIDES<T_SKEL_SIDE>* SidesOf(HINGE_COMPONENT c, HINGE_END end, int axialIndex);
 
+    // What the page shows. The page must exist.
+    /// Chooses an axial force of the list (index).
+    void OnSelChangeAxialCombo(HINGE_COMPONENT c, HINGE_END end, int index);
+    /// The chosen force; -1: the curve has no list in use.
+    int AxialIndex(HINGE_COMPONENT c, HINGE_END end);
+    /// The forces as texts.
+    std::vector<std::string> AxialTexts(HINGE_COMPONENT c, HINGE_END end);
+    /// The sides of the chosen force, or the curve's own.
+    T_SIDES<T_SKEL_SIDE>& ShownSides(HINGE_COMPONENT c, HINGE_END end);
+    /// The curve with these sides alone.
+    T_SKEL_FEMA ShownCurve(HINGE_COMPONENT c, HINGE_END end);
+    /// Limits of demand / capacity in use or not.
+    void OnDcRatioChk(HINGE_COMPONENT c, HINGE_END end, bool on);
+    /// After each edit: the negative side of a symmetric curve follows the positive one.
+    void OnEdited();
+    /// A finding's field on the page: of the chosen axial force as of the curve itself.
+    std::string FieldOnPages(const T_FINDING& f);
+    /// The first component that is edited.
+    HINGE_COMPONENT First() const;
+
 private:
     struct T_SWITCH {
         T_SKEL_FEMA before, after; // around the last switch of the measure
@@ -95,5 +118,6 @@ private:
 
     std::array<std::optional<T_HINGE_COMPONENT>, 6> m_components;
     std::array<std::array<std::optional<T_SWITCH>, 2>, 6> m_switches;
+    std::array<std::array<int, 2>, 6> m_axial{}; // chosen force of a page
     bool m_timeHistory = false;
 };

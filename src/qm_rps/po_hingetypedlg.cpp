@@ -1,6 +1,7 @@
 #include "qm_rps/po_hingetypedlg.h"
 
 #include "qm_rps/hingetypefindings.h"
+#include "qm_rps/po_hingealphayspandlg.h"
 #include "qm_rps/po_hingeintegrationpointdlg.h"
 #include "qm_rps/po_hingelengthmphidlg.h"
 #include "qm_rps/po_hingelengthmthetadlg.h"
@@ -34,17 +35,20 @@ void SetType(T_HINGE_COMPONENT& c, SKEL_TYPE type)
 
 /// Runs a curve editor that holds one component.
 template <class DLG>
-int RunEditor(DLG& dlg, zql::frx::IDialogView* view, HINGE_COMPONENT c, const T_HINGE_COMPONENT& in)
+int RunEditor(DLG& dlg, const CPO_HingeTypeDlg& type, HINGE_COMPONENT c)
 {
-    dlg.SetView(view);
+    dlg.SetView(type.View());
+    dlg.m_owner = type.Owner();
+    const T_HINGE_COMPONENT& in = type.Type().components[static_cast<std::size_t>(c)];
     return dlg.Data2Dlg(c, in) && dlg.DoModal();
 }
 
 /// Runs an editor that writes its record when it is accepted.
 template <class DLG>
-int RunOn(DLG& dlg, zql::frx::IDialogView* view)
+int RunOn(DLG& dlg, const CPO_HingeTypeDlg& type)
 {
-    dlg.SetView(view);
+    dlg.SetView(type.View());
+    dlg.m_owner = type.Owner();
     return dlg.DoModal() && dlg.OnOK();
 }
 
@@ -76,7 +80,9 @@ int CPO_HingeTypeDlg::OnApply()
     if (!CheckData()) return 0;
     const std::vector<T_FINDING> warnings = HingeTypeWarnings(m_type);
     if (!warnings.empty()) ShowMessage(warnings.front().messageKey, warnings.front().text);
-    return m_store && m_store(m_type);
+    if (m_store && m_store(m_type)) return 1;
+    if (m_store) ShowMessage("IDS_QM_HINGE_NOT_STORED");
+    return 0;
 }
 
 void CPO_HingeTypeDlg::OnUpdate(T_HINGE_CONTEXT context)
@@ -141,14 +147,14 @@ int CPO_HingeTypeDlg::OnBtnSkcvProp(HINGE_COMPONENT c)
     T_HINGE_COMPONENT& component = At(c);
     if (component.type == SKEL_TYPE::Fema) {
         CPO_HingeSkcvTabFemaDlg dlg;
-        return RunEditor(dlg, View(), c, component) && dlg.Dlg2Data(c, component);
+        return RunEditor(dlg, *this, c) && dlg.Dlg2Data(c, component);
     }
     if (component.type == SKEL_TYPE::Ec8) {
         CPO_HingeSkcvTabEuroDlg dlg;
-        return RunEditor(dlg, View(), c, component) && dlg.Dlg2Data(component);
+        return RunEditor(dlg, *this, c) && dlg.Dlg2Data(component);
     }
     CPO_HingeSkcvTabDlg dlg;
-    return RunEditor(dlg, View(), c, component) && dlg.Dlg2Data(component);
+    return RunEditor(dlg, *this, c) && dlg.Dlg2Data(component);
 }
 
 int CPO_HingeTypeDlg::OnSelChangeInteraction(int index)
@@ -187,7 +193,7 @@ int CPO_HingeTypeDlg::OnYieldSurfaceDlgDlg()
     const SKEL_TYPE curve = YieldSurfaceCurve(m_type);
     if (IsTrilinear(curve) && !surface.crack) surface.crack.emplace();
     CPO_HingeYieldPropDlgNew dlg(surface, curve);
-    if (!RunOn(dlg, View())) return 0;
+    if (!RunOn(dlg, *this)) return 0;
     m_type.yieldSurface = surface;
     return 1;
 }
@@ -196,7 +202,7 @@ int CPO_HingeTypeDlg::OnUserInteractionDlg()
 {
     T_PMM_TABLE table = m_type.pmm.value_or(T_PMM_TABLE{});
     CPushOverPMMInteractionDlg dlg(table);
-    if (!RunOn(dlg, View())) return 0;
+    if (!RunOn(dlg, *this)) return 0;
     m_type.pmm = table;
     return 1;
 }
@@ -205,6 +211,7 @@ int CPO_HingeTypeDlg::OnMasonryPropDlg()
 {
     CPO_HingeMasonryDlg dlg;
     dlg.SetView(View());
+    dlg.m_owner = Owner();
     T_MASONRY_HINGE masonry = m_type.masonry.value_or(T_MASONRY_HINGE{});
     dlg.Data2Dlg(masonry);
     if (!dlg.DoModal() || !dlg.Dlg2Data(masonry)) return 0;
@@ -227,6 +234,7 @@ int CPO_HingeTypeDlg::OnBtnHingeLength()
     if (m_type.definition == HINGE_DEFINITION::MomentRotation) {
         CPO_HingeLengthMThetaDlg dlg;
         dlg.SetView(View());
+        dlg.m_owner = Owner();
         dlg.Data2Dlg(m_type.length);
         if (!dlg.DoModal()) return 0;
         dlg.Dlg2Data(m_type.length);
@@ -234,10 +242,40 @@ int CPO_HingeTypeDlg::OnBtnHingeLength()
     }
     CPO_HingeLengthMPhiDlg dlg;
     dlg.SetView(View());
+    dlg.m_owner = Owner();
     dlg.SetData(m_type.length.components);
     if (!dlg.DoModal()) return 0;
     m_type.length.components = dlg.GetData();
     return 1;
+}
+
+int CPO_HingeTypeDlg::OnBtnAlphaYSpan()
+{
+    CPO_HingeAlphaYSpanDlg dlg;
+    dlg.SetView(View());
+    dlg.m_owner = Owner();
+    dlg.Data2Dlg(m_type.length);
+    if (!dlg.DoModal()) return 0;
+    dlg.Dlg2Data(m_type.length);
+    return 1;
+}
+
+void CPO_HingeTypeDlg::OnMasonryChk(bool on)
+{
+    if (on != m_type.masonry.has_value())
+        m_type.masonry = on ? std::optional(T_MASONRY_HINGE{}) : std::nullopt;
+}
+
+void CPO_HingeTypeDlg::OnInfillStrutChk(bool on)
+{
+    for (T_SKEL_CURVE* curve : {&m_type.components[0].curves.I, &m_type.components[0].curves.J})
+        if (auto* f = std::get_if<T_SKEL_FEMA>(curve)) f->infillStrut = on;
+}
+
+bool CPO_HingeTypeDlg::IsInfillStrut() const
+{
+    const auto* f = std::get_if<T_SKEL_FEMA>(&m_type.components[0].curves.I);
+    return f && f->infillStrut;
 }
 
 std::vector<T_FINDING> CPO_HingeTypeDlg::TypeFindings(const T_PHGT_D& type,

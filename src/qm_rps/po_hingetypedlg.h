@@ -5,6 +5,7 @@
 
 #include "qm_rps/hingecontext.h"
 #include "qm_rps/hingedialog.h"
+#include "qm_rps/hingelabels.h"
 
 #include <functional>
 
@@ -53,6 +54,13 @@ public:
     };
     using T_MODE = std::array<T_PART_STATE, static_cast<std::size_t>(PART::Count)>;
 
+    /// A page of an active component, as the preview offers it.
+    struct T_PAGE {
+        HINGE_COMPONENT component = HINGE_COMPONENT::Fx;
+        HINGE_END end = HINGE_END::Both;
+        std::string text; // "My: Properties, I-end"
+    };
+
     explicit CPO_HingeTypeDlg(T_HINGE_CONTEXT context);
 
     /// Writes the record to the document. 1 stored; 0 not. Unset: OnApply refuses.
@@ -69,7 +77,29 @@ public:
     /// The document has changed: options, codes and sections are read again, lists filled again.
     void OnUpdate(T_HINGE_CONTEXT context);
 
+    std::vector<std::string> m_otherNames; // of other types; the name must be unlike them
+
     const T_PHGT_D& Type() const { return m_type; }
+    T_HINGE_OWNER Owner() const { return {m_type, m_context.units}; }
+
+    /// What each component offers now, and the interactions in the order of their list.
+    std::vector<T_SKCV_ENTRY> CurveTypes(HINGE_COMPONENT c) const
+    {
+        return CustomizeSkcvCmb(m_type, c, m_context);
+    }
+    static std::vector<std::string> InteractionTexts();
+    /// The part of the editor that a finding is about: "name", "My.type", "My.curve", a field of
+    /// "yieldSurface.", "pmm." or "masonry."; and its editor (0: it has none, or was cancelled).
+    static std::string FieldOf(const T_FINDING& f);
+    [[nodiscard]] int OnFinding(const T_FINDING& f);
+
+    std::vector<T_PAGE> Pages() const;
+    /// Position of the page on show; -1: no component is active.
+    int Page() const;
+    void ShowPage(int index) { m_page = index; }
+    void ShowPageOf(HINGE_COMPONENT c);
+    /// The curve of the page on show, or null.
+    const T_SKEL_CURVE* PageCurve() const;
     void SetName(const std::string& name) { m_type.name = name; }
     void SetSection(int section, int material);
     void SetFibreSection(int section) { m_type.fibreSection = section; }
@@ -93,6 +123,8 @@ public:
     T_REF_LIST InitFiberCombo_Fibw() const;
     T_REF_LIST InitPropCombo_Sect() const;
     T_REF_LIST InitPropCombo_Thik() const;
+    /// Materials of the document.
+    T_REF_LIST InitPropCombo_Matl() const;
 
     /// Which parts are shown, and which of these can be used, for the element type, definition,
     /// material class, interaction and components.
@@ -136,6 +168,14 @@ public:
     [[nodiscard]] int OnBtnIntegrationPoint();
     /// Moment-rotation or moment-curvature lengths, by the definition.
     [[nodiscard]] int OnBtnHingeLength();
+    [[nodiscard]] int OnBtnAlphaYSpan();
+
+    /// Masonry properties on (with defaults) or off.
+    void OnMasonryChk(bool on);
+    void OnWithholdMzChk(bool on) { m_type.withholdMzLength = on; }
+    /// Strut form of the FEMA curves of Fx, on every page.
+    void OnInfillStrutChk(bool on);
+    bool IsInfillStrut() const;
 
     /// The bending components offer these interactions, in this order; My and Mz share one.
     static constexpr std::array<HINGE_INTERACTION, 4> kBendingInteractions{
@@ -160,7 +200,8 @@ public:
     /// See HingeTypeFindings. CheckData shows the first.
     static std::vector<T_FINDING> TypeFindings(const T_PHGT_D& type,
                                                const T_HINGE_CONTEXT& context);
-    std::vector<T_FINDING> Findings() const override { return TypeFindings(m_type, m_context); }
+    /// The same with the rule of the name.
+    std::vector<T_FINDING> Findings() const override;
 
 private:
     T_HINGE_COMPONENT& At(HINGE_COMPONENT c);
@@ -169,4 +210,5 @@ private:
 
     T_HINGE_CONTEXT m_context;
     T_PHGT_D m_type;
+    int m_page = 0;
 };

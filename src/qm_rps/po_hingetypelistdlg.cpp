@@ -1,6 +1,9 @@
 #include "qm_rps/po_hingetypelistdlg.h"
 
 #include "qm_base/msgfunction.h"
+#include "qm_rps/po_hingetypedlg.h"
+
+#include <algorithm>
 
 using zql::lib::MMSGFunction;
 
@@ -74,4 +77,72 @@ int CPO_HingeTypeListDlg::OnDelete()
     if (!m_access.erase(m_selected)) return 0;
     m_selected = 0;
     return 1;
+}
+
+int CPO_HingeTypeListDlg::OnAdd()
+{
+    return Edit(NextKey(), {}, true);
+}
+
+int CPO_HingeTypeListDlg::OnModify()
+{
+    return CheckData() ? Edit(m_selected, m_access.types().at(m_selected), false) : 0;
+}
+
+int CPO_HingeTypeListDlg::OnCopy()
+{
+    if (!CheckData() || !m_access.store) return 0;
+    const T_TABLE<T_PHGT_D> types = m_access.types();
+    T_PHGT_D copy = types.at(m_selected);
+    const auto taken = [&](const std::string& name) {
+        return std::ranges::any_of(types, [&](const auto& t) { return t.second.name == name; });
+    };
+    const std::string name = copy.name;
+    for (int n = 2; taken(copy.name); ++n)
+        copy.name = name + " (" + std::to_string(n) + ")";
+    const int key = NextKey();
+    if (!m_access.store(key, copy)) {
+        ShowMessage("IDS_QM_HINGE_NOT_STORED");
+        return 0;
+    }
+    m_selected = key;
+    return 1;
+}
+
+std::string CPO_HingeTypeListDlg::Description() const
+{
+    const T_TABLE<T_PHGT_D> types = m_access.types();
+    const auto type = types.find(m_selected);
+    if (type == types.end()) return {};
+    std::string components;
+    for (std::size_t i = 0; i < type->second.components.size(); ++i)
+        if (type->second.components[i].active)
+            components += (components.empty() ? "" : ", ") + std::string(kComponentNames[i]);
+    const std::vector<int> users = m_access.users(m_selected);
+    return MMSGFunction::Format("IDS_QM_UI_HINGE_DESCRIPTION",
+                                {NameOf(type->first, type->second.name),
+                                 components.empty() ? "-" : components,
+                                 users.empty() ? "-" : Listed(users)});
+}
+
+int CPO_HingeTypeListDlg::Edit(int key, const T_PHGT_D& type, bool fresh)
+{
+    if (!m_access.store || !m_access.context) return 0;
+    CPO_HingeTypeDlg dlg(m_access.context());
+    dlg.SetView(View());
+    dlg.m_store = [&](const T_PHGT_D& t) { return m_access.store(key, t); };
+    for (const auto& [other, record] : m_access.types())
+        if (other != key) dlg.m_otherNames.push_back(record.name);
+    dlg.Data2Dlg(type);
+    for (int c = 0; fresh && c < 6; ++c)
+        dlg.InitDataByDof(static_cast<HINGE_COMPONENT>(c));
+    if (!dlg.DoModal()) return 0;
+    m_selected = key;
+    return 1;
+}
+
+int CPO_HingeTypeListDlg::NextKey() const
+{
+    const T_TABLE<T_PHGT_D> types = m_access.types();
+    return types.empty() ? 1 : types.rbegin()->first + 1;
 }

@@ -4,6 +4,7 @@
 #include "qm_base/mdialog.h"
 #include "qm_db/hingerecords.h"
 #include "qm_db/records.h"
+#include "qm_rps/hingecontext.h"
 
 #include <functional>
 #include <optional>
@@ -13,6 +14,9 @@ struct T_HINGE_LIST_ACCESS {
     std::function<T_TABLE<T_PHGT_D>()> types;       // all hinge types by key
     std::function<std::vector<int>(int key)> users; // ids of the elements with hinges of the type
     std::function<int(int key)> erase;              // 1 deleted
+    /// Adds or replaces a type; 1 stored. Empty: types can't be edited.
+    std::function<int(int key, const T_PHGT_D& type)> store{};
+    std::function<T_HINGE_CONTEXT()> context{}; // of the editor
 };
 
 class CPO_HingeTypeListDlg : public zql::frx::MDialog {
@@ -43,7 +47,17 @@ public:
     int CheckData() override;
     /// Deletes the chosen type. 0 with a message: none chosen, gone, or used (naming elements).
     [[nodiscard]] int OnDelete();
+    /// A new type, or the chosen one, in the editor. 1 stored, and the type is chosen then.
+    [[nodiscard]] int OnAdd();
+    [[nodiscard]] int OnModify();
+    /// A copy of the chosen type under the next key, with a name of its own ("column (2)").
+    [[nodiscard]] int OnCopy();
+    /// The chosen type, "beam-column, My" and the elements that use it; empty: none is chosen.
+    std::string Description() const;
 
 private:
+    int Edit(int key, const T_PHGT_D& type, bool fresh);
+    int NextKey() const;
+
     T_HINGE_LIST_ACCESS m_access;
 };

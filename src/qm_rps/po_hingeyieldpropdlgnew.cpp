@@ -196,6 +196,27 @@ int CPO_HingeYieldPropDlgNew::OnOK()
     return 1;
 }
 
+std::vector<CPO_HingeYieldPropDlgNew::T_LEVEL> CPO_HingeYieldPropDlgNew::Levels()
+{
+    constexpr const char* yield = "IDS_QM_UI_HINGE_LEVEL_YIELD";
+    if (m_type == SKEL_TYPE::Ec8)
+        return {{"yield.", yield, &m_surface.yield, "PC0(t)", "MC0", "MU"}};
+    std::vector<T_LEVEL> out;
+    if (m_type == SKEL_TYPE::Trilinear || m_type == SKEL_TYPE::SlipTrilinear) {
+        if (!m_surface.crack) m_surface.crack.emplace();
+        out.push_back(
+            {"crack.", "IDS_QM_UI_HINGE_LEVEL_CRACK", &*m_surface.crack, "PC(t)", "MC", "MY"});
+    }
+    out.push_back({"yield.", yield, &m_surface.yield, "PY(t)", "MY", "MU"});
+    return out;
+}
+
+void CPO_HingeYieldPropDlgNew::OnAxisChk(bool aboutY, bool used)
+{
+    (aboutY ? m_surface.yield.y : m_surface.yield.z).used = used;
+    if (m_surface.crack) (aboutY ? m_surface.crack->y : m_surface.crack->z).used = used;
+}
+
 std::string CPO_HingeYieldPropDlgNew::AxisNoteKey(bool aboutY) const
 {
     if (aboutY) return m_surface.yield.y.used ? "" : "IDS_RPS_PO_Y_AXIS_NOT_USED";

@@ -3,9 +3,12 @@
 
 #include "qm_db/hingerecords.h"
 #include "qm_rps/hingedialog.h"
+#include "qm_rps/hingelabels.h"
 
 class CPO_HingeYieldPropDlgNew : public CHingeDialog {
 public:
+    T_HINGE_OWNER m_owner; // for titles and units
+
     /// The normaliser of the moments of an Eurocode surface, as shown.
     static constexpr const char* kMomentNormaliserText =
         " Mmax = max ( |MUy(+)|, |MUy(-)|, |MUz(+)|, |MUz(-)| )";
@@ -30,6 +33,24 @@ public:
     std::vector<T_FINDING> Findings() const override;
     /// 1 and the record holds the surface; 0 and the record is unchanged.
     int OnOK() override;
+
+    /// A level as it is shown: where findings have it, and the names of its strengths.
+    struct T_LEVEL {
+        const char* prefix;             // "crack.", "yield."
+        const char* titleKey;           // of its page
+        T_YIELD_LEVEL* level;           // of m_surface
+        const char* tension;            // "PC(t)"
+        const char *moment, *momentMax; // "MC", "MY": "MCy(+)", "MYy,max(+)"
+    };
+    /// The levels of the curve type. A crack level that is missing is made.
+    std::vector<T_LEVEL> Levels();
+    /// Takes an axis into use, or out of it, in every level.
+    void OnAxisChk(bool aboutY, bool used);
+    bool IsAxisUsed(bool aboutY) const
+    {
+        return aboutY ? m_surface.yield.y.used : m_surface.yield.z.used;
+    }
+    bool IsEurocode() const { return m_type == SKEL_TYPE::Ec8; }
 
     /// Key of the note in place of an axis that is not used; empty where it is used.
     std::string AxisNoteKey(bool aboutY) const;

@@ -10,6 +10,12 @@ std::string CPO_HingeYieldPropGrid::ColumnHead(std::size_t column) const
     return m_showValue ? FormatText("M%c%s", axis, side) : FormatText("M/MY%c,max%s", axis, side);
 }
 
+std::string CPO_HingeYieldPropGrid::CellField(std::size_t row, std::size_t column) const
+{
+    return FormatText("%c.curves.%s[%zu].%c", m_aboutY ? 'y' : 'z', column < 2 ? "pos" : "neg", row,
+                      column % 2 == 0 ? 'p' : 'm');
+}
+
 double* CPO_HingeYieldPropGrid::CellOf(std::size_t row, std::size_t column) const
 {
     T_PM_POINT& point = (column < 2 ? Axis().curves.pos : Axis().curves.neg)[row];

@@ -22,6 +22,8 @@ public:
     std::size_t Columns() const override { return 4; }
     std::string RowHead(std::size_t row) const override { return kPmPointNames.at(row); }
     std::string ColumnHead(std::size_t column) const override;
+    /// In the level: "y.curves.pos[3].m".
+    std::string CellField(std::size_t row, std::size_t column) const override;
 
 protected:
     double* CellOf(std::size_t row, std::size_t column) const override;

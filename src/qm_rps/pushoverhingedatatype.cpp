@@ -4,6 +4,8 @@
 #include "qm_rps/hingemirror.h"
 #include "qm_rps/po_hingetypelistdlg.h"
 
+#include <algorithm>
+
 namespace {
 
 using B = T_BACKBONE;
@@ -50,9 +52,58 @@ int CPushOverHingeDataType::Data2Dlg(int key, HINGE_COMPONENT component)
     if (!std::holds_alternative<T_SKEL_FEMA>(c.curves.I)) return 0;
     m_key = key;
     m_component = component;
-    m_type = *type;
+    m_type = m_given = *type;
     m_taken = true;
     return 1;
+}
+
+int CPushOverHingeDataType::ChooseFirst()
+{
+    const T_TABLE<T_PHGT_D> types = m_types ? m_types() : T_TABLE<T_PHGT_D>{};
+    for (const auto& [key, type] : types)
+        for (std::size_t c = 0; c < type.components.size(); ++c)
+            if (type.components[c].active && type.components[c].type == SKEL_TYPE::Fema)
+                return Data2Dlg(key, static_cast<HINGE_COMPONENT>(c));
+    if (types.empty()) return Data2Dlg(0, m_component);
+    m_key = types.begin()->first;
+    return 1;
+}
+
+void CPushOverHingeDataType::OnSelChange(int key, HINGE_COMPONENT component)
+{
+    const bool edited = m_taken && m_type != m_given;
+    if (edited && !AskYesNo("IDS_QM_UI_HINGE_LOSE_EDITS")) return;
+    if (Data2Dlg(key, component)) return;
+    m_key = key;
+    m_component = component;
+    m_taken = false;
+}
+
+bool CPushOverHingeDataType::IsSymmetric() const
+{
+    const T_SKEL_FEMA* curve = Shown();
+    return curve && curve->symmetric;
+}
+
+const T_SKEL_FEMA* CPushOverHingeDataType::Shown() const
+{
+    if (!m_taken) return nullptr;
+    return std::get_if<T_SKEL_FEMA>(
+        &m_type.components[static_cast<std::size_t>(m_component)].curves.I);
+}
+
+void CPushOverHingeDataType::OnEdited()
+{
+    if (!m_taken) return;
+    T_HINGE_COMPONENT& c = m_type.components[static_cast<std::size_t>(m_component)];
+    c = MirroredComponent(c);
+}
+
+std::string CPushOverHingeDataType::PointField(std::size_t row)
+{
+    if (row == kOrigin || row >= kRows.size()) return {};
+    const std::string side = row > kOrigin ? "sides.pos." : "sides.neg.";
+    return side + kRows[std::max(row, 2 * kOrigin - row)] + ".";
 }
 
 T_SKEL_FEMA* CPushOverHingeDataType::Curve()
@@ -98,6 +149,7 @@ std::vector<T_FINDING> CPushOverHingeDataType::Findings() const
 
 int CPushOverHingeDataType::OnOK()
 {
+    if (!m_taken) ShowMessage("IDS_QM_UI_HINGE_NO_FEMA");
     if (!m_taken || !CheckData()) return 0;
     if (const auto fault = CPO_HingeTypeListDlg::ChoiceFault(m_key, m_find(m_key).has_value())) {
         ShowMessage(fault->key, fault->text);

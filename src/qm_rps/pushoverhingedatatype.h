@@ -3,7 +3,9 @@
 // Units: as the type's. Signs: the negative side holds negative numbers.
 #pragma once
 
+#include "qm_db/records.h"
 #include "qm_rps/hingedialog.h"
+#include "qm_rps/hingelabels.h"
 #include "qm_rps/hingesiderules.h"
 
 #include <functional>
@@ -20,6 +22,27 @@ public:
     /// The type of a key, or none; and how it is stored (1 done).
     std::function<std::optional<T_PHGT_D>(int key)> m_find;
     std::function<int(int key, const T_PHGT_D&)> m_store;
+
+    std::function<T_TABLE<T_PHGT_D>()> m_types; // all hinge types by key
+    T_UNITS m_units;
+
+    /// Chooses the first FEMA curve of the document, or its first type where there is none. 0 with
+    /// a message: the document has no hinge type.
+    [[nodiscard]] int ChooseFirst();
+    /// Chooses another type or component. Edits of the one on show are lost: the person is asked
+    /// first. Where the component has no FEMA curve nothing can be edited (IsTaken).
+    void OnSelChange(int key, HINGE_COMPONENT component);
+    int Key() const { return m_key; }
+    HINGE_COMPONENT ComponentOnShow() const { return m_component; }
+    bool IsTaken() const { return m_taken; }
+    bool IsSymmetric() const;
+    T_HINGE_OWNER Owner() const { return {m_type, m_units}; }
+    /// The curve as edited, or null.
+    const T_SKEL_FEMA* Shown() const;
+    /// After each edit: the negative side of a symmetric curve follows the positive one.
+    void OnEdited();
+    /// Field of a point's values, as findings name it: "sides.pos.B."; empty for A.
+    static std::string PointField(std::size_t row);
 
     /// Takes a type and shows the diagram of a component. 0 with a message: no type chosen (key 0),
     /// or it does not exist; 0 without one: the component has no FEMA curve. Nothing changes then.
@@ -42,5 +65,6 @@ private:
     int m_key = 0;
     HINGE_COMPONENT m_component = HINGE_COMPONENT::My;
     T_PHGT_D m_type;
+    T_PHGT_D m_given; // as it was taken
     bool m_taken = false;
 };

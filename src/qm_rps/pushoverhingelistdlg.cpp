@@ -83,3 +83,69 @@ int CPushOverHingeListDlg::CheckData()
     ShowMessage(gone, MMSGFunction::Format(gone, {std::to_string(m_selected)}));
     return 0;
 }
+
+std::optional<HINGE_ELEMENT> CPushOverHingeListDlg::TypeElement() const
+{
+    if (!m_types) return std::nullopt;
+    const T_TABLE<T_PHGT_D> types = m_types();
+    const auto type = types.find(m_type);
+    return type == types.end() ? std::nullopt : std::optional(type->second.element);
+}
+
+void CPushOverHingeListDlg::OnSelChangeType(int type)
+{
+    const std::optional<HINGE_ELEMENT> before = TypeElement();
+    m_type = type;
+    if (TypeElement() != before) m_options = {};
+}
+
+std::vector<int> CPushOverHingeListDlg::Elements() const
+{
+    if (m_options.selectedOnly) return m_options.elements;
+    const std::optional<HINGE_ELEMENT> element = TypeElement();
+    return element && m_elements ? m_elements(*element) : std::vector<int>();
+}
+
+int CPushOverHingeListDlg::OnOptionBtn()
+{
+    const std::optional<HINGE_ELEMENT> element = TypeElement();
+    if (const auto fault = CPO_HingeTypeListDlg::ChoiceFault(m_type, element.has_value())) {
+        ShowMessage(fault->key, fault->text);
+        return 0;
+    }
+    // Walls are elements of beams in the model.
+    const bool wall = *element == HINGE_ELEMENT::Wall;
+    CYieldStrengthCalcOptDlg dlg(wall ? HINGE_ELEMENT::BeamColumn : *element);
+    dlg.SetView(View());
+    dlg.m_units = m_units;
+    dlg.m_kindOf = m_kindOf;
+    dlg.SetData(m_options);
+    if (m_elements) dlg.SetElements(m_elements(*element), m_lookup);
+    if (!dlg.DoModal()) return 0;
+    dlg.GetData(m_options);
+    return 1;
+}
+
+int CPushOverHingeListDlg::OnGenerate()
+{
+    if (const auto fault = CPO_HingeTypeListDlg::ChoiceFault(m_type, TypeElement().has_value())) {
+        ShowMessage(fault->key, fault->text);
+        return 0;
+    }
+    std::string refusal;
+    if (m_generate && m_generate(m_type, Elements(), refusal)) return 1;
+    ShowMessage("IDS_QM_HINGE_NOT_STORED",
+                refusal.empty() ? MMSGFunction::GetValue("IDS_QM_HINGE_NOT_STORED") : refusal);
+    return 0;
+}
+
+int CPushOverHingeListDlg::OnDelete()
+{
+    if (!CheckData()) return 0;
+    if (!m_erase || !m_erase(m_selected)) {
+        ShowMessage("IDS_QM_HINGE_NOT_STORED");
+        return 0;
+    }
+    m_selected = 0;
+    return 1;
+}

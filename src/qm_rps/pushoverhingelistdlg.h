@@ -4,6 +4,7 @@
 #include "qm_base/mdialog.h"
 #include "qm_db/hingerecords.h"
 #include "qm_db/records.h"
+#include "qm_rps/yieldstrengthcalcoptdlg.h"
 
 #include <functional>
 #include <vector>
@@ -37,4 +38,32 @@ public:
 
     /// The chosen hinge exists. 0 with a message otherwise.
     int CheckData() override;
+
+    /// Hinges of a type for elements; 1 stored, 0 with the reason. Deletes a hinge; 1 deleted.
+    std::function<int(int type, const std::vector<int>& elements, std::string& refusal)> m_generate;
+    std::function<int(int key)> m_erase;
+    /// Elements of the document that hinges of such a type can be for, ascending; the kind of an
+    /// element; its section and material.
+    std::function<std::vector<int>(HINGE_ELEMENT)> m_elements;
+    std::function<std::optional<HINGE_ELEMENT>(int id)> m_kindOf;
+    T_YIELD_CALC_LOOKUP m_lookup;
+    T_UNITS m_units;      // of the strengths
+    bool m_crack = false; // crack strengths are shown, else yield strengths
+    int m_type = 0;       // key of the type of new hinges; 0: none
+
+    /// Another type: the elements are all that suit it again, where the kind is another one.
+    void OnSelChangeType(int type);
+    /// Which elements get hinges: all, or those of the options.
+    std::vector<int> Elements() const;
+    /// Runs the options of the yield strength calculation in the view; 1 accepted.
+    [[nodiscard]] int OnOptionBtn();
+    /// Hinges of the type for these elements, one edit. 0 with a message.
+    [[nodiscard]] int OnGenerate();
+    /// Deletes the chosen hinge. 0 with a message.
+    [[nodiscard]] int OnDelete();
+
+private:
+    std::optional<HINGE_ELEMENT> TypeElement() const;
+
+    T_YIELD_CALC_OPT m_options;
 };

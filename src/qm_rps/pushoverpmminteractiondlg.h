@@ -3,9 +3,12 @@
 
 #include "qm_db/hingerecords.h"
 #include "qm_rps/hingedialog.h"
+#include "qm_rps/hingelabels.h"
 
 class CPushOverPMMInteractionDlg : public CHingeDialog {
 public:
+    T_HINGE_OWNER m_owner; // for titles and units
+
     /// Edits a copy; OnOK writes the whole table back to `record`, which is not owned.
     explicit CPushOverPMMInteractionDlg(T_PMM_TABLE& record) : m_table(record), m_record(record) {}
 

@@ -21,6 +21,8 @@ public:
 
     std::size_t Rows() const override { return m_table.curves[0].size(); }
     std::string RowHead(std::size_t row) const override { return std::to_string(row + 1); }
+    /// In the table: "curves[0][3].m".
+    std::string CellField(std::size_t row, std::size_t column) const override;
 
 private:
     T_PM_POINT& Point(std::size_t row) const override { return m_table.curves[m_curve / 2][row]; }

@@ -1,5 +1,7 @@
 #include "qm_rps/yieldstrengthcalcoptdlg.h"
 
+#include "qm_base/msgfunction.h"
+#include "qm_rps/elementlist.h"
 #include "qm_rps/yieldstrengthcalcopteffdescdlg.h"
 
 #include <algorithm>
@@ -46,6 +48,33 @@ int CYieldStrengthCalcOptDlg::OnSelectElemChk(bool on,
     return 1;
 }
 
+int CYieldStrengthCalcOptDlg::OnSelectionText(const std::string& text)
+{
+    const std::optional<std::vector<int>> ids = ParseElementList(text);
+    if (!ids) {
+        ShowMessage("IDS_QM_UI_HINGE_NO_LIST");
+        return 0;
+    }
+    std::vector<T_SELECTED_ELEM> selection;
+    for (const int id : *ids) {
+        const std::optional<HINGE_ELEMENT> kind = m_kindOf ? m_kindOf(id) : std::nullopt;
+        if (!kind) {
+            const std::string why = zql::lib::MMSGFunction::GetValue("IDS_CMD_IEHP_NO_ELEM");
+            ShowMessage(
+                "IDS_CMD_IEHP_NO_ELEM",
+                zql::lib::MMSGFunction::Format("IDS_QM_HINGE_ELEMENT", {std::to_string(id), why}));
+            return 0;
+        }
+        selection.push_back({id, *kind});
+    }
+    return OnSelectElemChk(true, selection);
+}
+
+std::string CYieldStrengthCalcOptDlg::SelectionText() const
+{
+    return ElementListText(m_data.elements);
+}
+
 void CYieldStrengthCalcOptDlg::SetElements(std::vector<int> elements, T_YIELD_CALC_LOOKUP lookup)
 {
     m_all = std::move(elements);
@@ -55,6 +84,7 @@ void CYieldStrengthCalcOptDlg::SetElements(std::vector<int> elements, T_YIELD_CA
 int CYieldStrengthCalcOptDlg::OnMatlDescBtn()
 {
     CYieldStrengthCalcOptMatDescDlg dlg(Elements(), m_lookup);
+    dlg.m_units = m_units;
     dlg.SetView(View());
     return dlg.DoModal();
 }
@@ -62,6 +92,7 @@ int CYieldStrengthCalcOptDlg::OnMatlDescBtn()
 int CYieldStrengthCalcOptDlg::OnEffeDescBtn()
 {
     CYieldStrengthCalcOptEffDescDlg dlg(Elements(), m_lookup);
+    dlg.m_units = m_units;
     dlg.SetView(View());
     return dlg.DoModal();
 }

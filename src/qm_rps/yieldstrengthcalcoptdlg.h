@@ -3,6 +3,7 @@
 
 #include "qm_rps/yieldstrengthcalcoptmatdescdlg.h"
 
+#include <string>
 #include <string_view>
 
 enum class YIELD_CODE { General, Eurocode, Aij };
@@ -20,6 +21,7 @@ struct T_SELECTED_ELEM {
 
 class CYieldStrengthCalcOptDlg : public zql::frx::MDialog {
 public:
+    T_UNITS m_units; // for the heads of the descriptions
     /// `element`: the kind of element that the calculation is for.
     explicit CYieldStrengthCalcOptDlg(HINGE_ELEMENT element = HINGE_ELEMENT::BeamColumn)
         : m_element(element)
@@ -38,6 +40,14 @@ public:
     /// Restricts the calculation to the selection, or takes the restriction off. 0 shows
     /// IDS_CMD2_SOD_SEL_ELEM_WRONG_ELEM for an element of another kind; the options stay.
     int OnSelectElemChk(bool on, const std::vector<T_SELECTED_ELEM>& selection);
+    /// Kind of an element of the document, or none: it does not exist.
+    std::function<std::optional<HINGE_ELEMENT>(int id)> m_kindOf;
+    /// Restricts the calculation to the elements of a list, "1, 2, 5-9". 0 with a message: no such
+    /// list, or an element does not exist or is of another kind; the options stay.
+    int OnSelectionText(const std::string& text);
+    std::string SelectionText() const;
+    const T_YIELD_CALC_OPT& Data() const { return m_data; }
+
     /// Elements that the calculation is for when it is not restricted, ascending, and where their
     /// sections and materials come from.
     void SetElements(std::vector<int> elements, T_YIELD_CALC_LOOKUP lookup);

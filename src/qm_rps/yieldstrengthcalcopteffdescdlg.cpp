@@ -1,6 +1,9 @@
 #include "qm_rps/yieldstrengthcalcopteffdescdlg.h"
 
+#include "qm_base/msgfunction.h"
+#include "qm_base/textformat.h"
 #include "qm_db/sectionproperties.h"
+#include "qm_rps/hingelabels.h"
 
 namespace {
 
@@ -8,6 +11,20 @@ T_SECT_FACTORS Effective(const T_SECT_D& s, const T_SECT_FACTORS& f)
 {
     return {s.area * f.area, s.Asy * f.Asy, s.Asz * f.Asz, s.J * f.J, s.Iyy * f.Iyy, s.Izz * f.Izz};
 }
+
+/// A property of the table: its symbol, dimension and place.
+struct T_PROPERTY {
+    const char* symbol;
+    T_DIM dim;
+    double T_SECT_FACTORS::*value;
+};
+// clang-format off
+constexpr T_PROPERTY kProperties[] = {
+    {"A",   {0, 2}, &T_SECT_FACTORS::area}, {"Asy", {0, 2}, &T_SECT_FACTORS::Asy},
+    {"Asz", {0, 2}, &T_SECT_FACTORS::Asz},  {"J",   {0, 4}, &T_SECT_FACTORS::J},
+    {"Iyy", {0, 4}, &T_SECT_FACTORS::Iyy},  {"Izz", {0, 4}, &T_SECT_FACTORS::Izz},
+};
+// clang-format on
 
 } // namespace
 
@@ -33,4 +50,34 @@ CYieldStrengthCalcOptEffDescDlg::CYieldStrengthCalcOptEffDescDlg(const std::vect
         row.effective = {Effective(s, s.factorsI), Effective(s, s.factorsJ)};
         row.plasticModuli = {s.Zy, s.Zz};
     }
+}
+
+std::vector<std::string> CYieldStrengthCalcOptEffDescDlg::Heads() const
+{
+    std::vector<std::string> heads{HingeHead("IDS_QM_UI_HEAD_ELEMENT", kDimNone, m_units),
+                                   HingeHead("IDS_CMD_IEHP_SECT_TXT", kDimNone, m_units)};
+    for (const char* end : {", I", ", J"})
+        for (const T_PROPERTY& p : kProperties)
+            heads.push_back(HingeHead(std::string(p.symbol) + end, p.dim, m_units));
+    for (const char* symbol : {"Zy", "Zz"})
+        heads.push_back(HingeHead(symbol, {0, 3}, m_units));
+    return heads;
+}
+
+std::vector<std::string> CYieldStrengthCalcOptEffDescDlg::Cells(std::size_t row) const
+{
+    const T_ROW& r = m_rows.at(row);
+    if (*r.faultKey) {
+        std::vector<std::string> cells(Heads().size());
+        cells[0] = std::to_string(r.element);
+        cells[1] = zql::lib::MMSGFunction::GetValue(r.faultKey);
+        return cells;
+    }
+    std::vector<std::string> cells{std::to_string(r.element), r.section};
+    for (const T_SECT_FACTORS& end : {r.effective.I, r.effective.J})
+        for (const T_PROPERTY& p : kProperties)
+            cells.push_back(ShortestText(end.*p.value));
+    for (const double z : r.plasticModuli)
+        cells.push_back(ShortestText(z));
+    return cells;
 }

@@ -6,6 +6,7 @@
 
 class CYieldStrengthCalcOptEffDescDlg : public zql::frx::MDialog {
 public:
+    T_UNITS m_units; // for the heads
     /// What the numbers mean.
     static constexpr const char* kNoteKey = "IDS_QM_YSCO_SECTION";
     struct T_ROW {
@@ -21,6 +22,10 @@ public:
     CYieldStrengthCalcOptEffDescDlg(const std::vector<int>& elements,
                                     const T_YIELD_CALC_LOOKUP& lookup);
     const std::vector<T_ROW>& Rows() const { return m_rows; }
+    /// The rows as a table with units in its heads; where something is missing the last cell says
+    /// what.
+    std::vector<std::string> Heads() const;
+    std::vector<std::string> Cells(std::size_t row) const;
 
 private:
     std::vector<T_ROW> m_rows;

@@ -1,5 +1,9 @@
 #include "qm_rps/yieldstrengthcalcoptmatdescdlg.h"
 
+#include "qm_base/msgfunction.h"
+#include "qm_base/textformat.h"
+#include "qm_rps/hingelabels.h"
+
 CYieldStrengthCalcOptMatDescDlg::CYieldStrengthCalcOptMatDescDlg(const std::vector<int>& elements,
                                                                  const T_YIELD_CALC_LOOKUP& lookup)
 {
@@ -19,4 +23,25 @@ CYieldStrengthCalcOptMatDescDlg::CYieldStrengthCalcOptMatDescDlg(const std::vect
         if (m.type != MATL_CLASS::Steel) row.fck = m.fck;
         if (bars) row.fyk = m.fyk, row.Es = m.Es;
     }
+}
+
+std::vector<std::string> CYieldStrengthCalcOptMatDescDlg::Heads() const
+{
+    std::vector<std::string> heads{HingeHead("IDS_QM_UI_HEAD_ELEMENT", kDimNone, m_units),
+                                   HingeHead("IDS_QM_UI_HINGE_MATERIAL", kDimNone, m_units)};
+    for (const char* symbol : {"Fy", "fck", "fyk", "E", "Es"})
+        heads.push_back(HingeHead(symbol, kDimStress, m_units));
+    return heads;
+}
+
+std::vector<std::string> CYieldStrengthCalcOptMatDescDlg::Cells(std::size_t row) const
+{
+    const T_ROW& r = m_rows.at(row);
+    std::vector<std::string> cells{std::to_string(r.element),
+                                   r.material.empty() && *r.faultKey
+                                       ? zql::lib::MMSGFunction::GetValue(r.faultKey)
+                                       : r.material};
+    for (const std::optional<double>& v : {r.Fy, r.fck, r.fyk, r.E, r.Es})
+        cells.push_back(v ? ShortestText(*v) : std::string());
+    return cells;
 }

@@ -16,6 +16,7 @@ using T_YIELD_CALC_LOOKUP = std::function<T_YIELD_CALC_ELEM(int element)>;
 
 class CYieldStrengthCalcOptMatDescDlg : public zql::frx::MDialog {
 public:
+    T_UNITS m_units; // for the heads
     /// What the numbers mean.
     static constexpr const char* kNoteKey = "IDS_QM_YSCO_MATERIAL";
     /// Strengths that the material's class uses; the others are empty.
@@ -33,6 +34,10 @@ public:
     CYieldStrengthCalcOptMatDescDlg(const std::vector<int>& elements,
                                     const T_YIELD_CALC_LOOKUP& lookup);
     const std::vector<T_ROW>& Rows() const { return m_rows; }
+    /// The rows as a table with units in its heads; where something is missing the last cell says
+    /// what.
+    std::vector<std::string> Heads() const;
+    std::vector<std::string> Cells(std::size_t row) const;
 
 private:
     std::vector<T_ROW> m_rows;

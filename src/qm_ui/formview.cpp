@@ -93,9 +93,21 @@ void CFormView::Columns()
     NextColumn();
 }
 
+/// Fields stay together at the top where nothing grows.
+void CFormView::CloseColumn()
+{
+    if (QGridLayout* grid = m_boxes.back().grid) {
+        bool grows = false;
+        for (int row = 0; row < grid->rowCount(); ++row)
+            grows = grows || grid->rowStretch(row) > 0;
+        if (!grows) grid->setRowStretch(m_boxes.back().row, 1);
+    }
+    m_boxes.pop_back();
+}
+
 void CFormView::NextColumn(int stretch)
 {
-    m_boxes.pop_back();
+    CloseColumn();
     auto* column = new QWidget(this);
     m_boxes.back().columns->addWidget(column, stretch);
     m_boxes.push_back(NewBox(column));
@@ -104,7 +116,7 @@ void CFormView::NextColumn(int stretch)
 
 void CFormView::EndColumns()
 {
-    m_boxes.pop_back();
+    CloseColumn();
     m_boxes.pop_back();
 }
 
@@ -117,7 +129,7 @@ void CFormView::Space()
 void CFormView::Page(TextFn title, std::function<bool()> shown)
 {
     if (!m_boxes.back().tabs && m_boxes.size() > 1 && m_boxes[m_boxes.size() - 2].tabs)
-        m_boxes.pop_back(); // the page before
+        CloseColumn(); // the page before
     if (!m_boxes.back().tabs) {
         auto* tabs = new QTabWidget(this);
         AddWide(tabs);
@@ -137,7 +149,29 @@ void CFormView::Page(TextFn title, std::function<bool()> shown)
 
 void CFormView::EndPages()
 {
+    CloseColumn();
     m_boxes.pop_back();
+}
+
+void CFormView::Cells(std::vector<TextFn> heads)
+{
+    auto* table = new QWidget(this);
+    AddWide(table);
+    T_BOX box = NewBox(table);
+    box.grid->setContentsMargins(0, 0, 0, 0);
+    for (TextFn& head : heads) {
+        auto* label = new QLabel(table);
+        box.grid->addWidget(label, 0, box.cells);
+        box.grid->setColumnStretch(box.cells, box.cells > 0 ? 1 : 0);
+        m_titles.push_back({std::move(head), [label](const QString& t) { label->setText(t); }});
+        ++box.cells;
+    }
+    box.row = 1;
+    m_boxes.push_back(box);
+}
+
+void CFormView::EndCells()
+{
     m_boxes.pop_back();
 }
 
@@ -145,7 +179,12 @@ CFormField& CFormView::Add(TextFn caption, std::unique_ptr<CFormField> field, co
 {
     QWidget* const widget = field->widget;
     field->caption = std::move(caption);
-    if (!field->caption) {
+    if (T_BOX& table = m_boxes.back(); table.cells > 0) {
+        table.grid->addWidget(widget, table.row + table.cell / table.cells,
+                              table.cell % table.cells);
+        ++table.cell;
+        widget->setAccessibleName(Plain(field->caption));
+    } else if (!field->caption) {
         AddWide(widget);
     } else {
         T_BOX& box = m_boxes.back();

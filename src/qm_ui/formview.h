@@ -35,6 +35,10 @@ public:
 
     /// Room that is left goes here: what follows is at the bottom.
     void Space();
+    /// A table of fields: each one that follows stands in the next cell, row by row under the
+    /// heads. Captions are not shown; screen readers get them.
+    void Cells(std::vector<TextFn> heads);
+    void EndCells();
 
     // ---- fields; unit: text after the widget ----
     CFormField& Number(TextFn caption, T_BINDING<double> binding, TextFn unit = {});
@@ -83,6 +87,8 @@ private:
         int row = 0;
         QBoxLayout* columns = nullptr; // of a row of columns
         QTabWidget* tabs = nullptr;
+        int cells = 0; // columns of a table of fields
+        int cell = 0;  // the next one
     };
     struct T_TITLE {
         TextFn text;
@@ -92,6 +98,7 @@ private:
         std::function<bool()> shown{};
     };
     T_BOX NewBox(QWidget* host);
+    void CloseColumn();
     void AddWide(QWidget* widget);
     CFormField& Add(TextFn caption, std::unique_ptr<CFormField> field, const TextFn& unit = {});
     void ShowTitles();

@@ -91,3 +91,23 @@ T_PLOT HingeInteractionPlot(const T_PHGT_D& type, const T_YIELD_LEVEL& level,
     }
     return plot;
 }
+
+T_PLOT UserInteractionPlot(const T_PHGT_D& type, const T_PMM_TABLE& table)
+{
+    T_PLOT plot;
+    plot.title = "Hinge type " + type.name + ", interaction of the user";
+    plot.x.title = "M / Mmax (-)";
+    plot.y.title = "P / Pmax, compression positive (-)";
+    for (std::size_t i = 0; i < table.curves.size(); ++i) {
+        T_PLOT_SERIES s;
+        s.name = i == 0 ? "Py-My" : "Pz-Mz";
+        s.line = i == 0 ? PLOT_LINE::Solid : PLOT_LINE::Dash;
+        s.marker = PLOT_MARKER::Circle;
+        for (const T_PM_POINT& p : table.curves[i]) {
+            s.x.push_back(p.m);
+            s.y.push_back(p.p);
+        }
+        plot.series.push_back(std::move(s));
+    }
+    return plot;
+}

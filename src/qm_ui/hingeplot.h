@@ -12,3 +12,6 @@ T_PLOT HingeBackbonePlot(const T_PHGT_D& type, HINGE_COMPONENT component, const 
 /// Interaction curves of one level of a yield surface, about y and z, both signs.
 T_PLOT HingeInteractionPlot(const T_PHGT_D& type, const T_YIELD_LEVEL& level,
                             const std::string& what);
+
+/// P-M curves of the user, one per axis.
+T_PLOT UserInteractionPlot(const T_PHGT_D& type, const T_PMM_TABLE& table);

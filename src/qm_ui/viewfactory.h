@@ -13,9 +13,9 @@
 
 /// How a view fills its window.
 struct T_VIEW {
-    TextFn title;
+    TextFn title{};
     /// Adds fields and bindings. Null for a model that has a window of its own (see window).
-    std::function<void(CFormView& form, zql::frx::MDialog& model)> build;
+    std::function<void(CFormView& form, zql::frx::MDialog& model)> build{};
     /// The text of the accepting button; empty: "OK". A window that only shows has none.
     TextFn accept{};
     bool showsOnly = false; // one button, "Close"

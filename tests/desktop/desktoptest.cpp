@@ -132,6 +132,7 @@ CAnswers::STEP CAnswers::Fill(std::function<void(CDialogWindow&)> fill, bool acc
     return [fill = std::move(fill), accept](QWidget& window) {
         auto* dialog = dynamic_cast<CDialogWindow*>(&window);
         ASSERT_NE(nullptr, dialog);
+        QApplication::setActiveWindow(dialog); // a window over another one, too, has the keyboard
         fill(*dialog);
         if (accept) dialog->accept();
     };
