@@ -20,3 +20,17 @@ CRPSDlgBase& CModelessDlgCtrl::Add(int id, std::unique_ptr<CRPSDlgBase> dialog)
     place = std::move(dialog);
     return *place;
 }
+
+void CModelessDlgCtrl::Close(int id)
+{
+    const auto it = m_dialogs.find(id);
+    if (it == m_dialogs.end()) return;
+    it->second->DestroyWindow();
+    m_dialogs.erase(it);
+}
+
+void CModelessDlgCtrl::CloseAll()
+{
+    while (!m_dialogs.empty())
+        Close(m_dialogs.begin()->first);
+}

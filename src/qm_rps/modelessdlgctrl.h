@@ -10,6 +10,8 @@
 /// in the document's module registry under kName.
 class CModelessDlgCtrl : public CDynModule {
 public:
+    ~CModelessDlgCtrl() override { CloseAll(); }
+
     static constexpr const char* kName = "CModelessDlgCtrl";
     /// The document's controller, made when it is first asked for.
     static CModelessDlgCtrl& Of(CDBDoc& doc);
@@ -26,8 +28,8 @@ public:
     CRPSDlgBase* Find(int id) const;
     CRPSDlgBase& Add(int id, std::unique_ptr<CRPSDlgBase> dialog);
     /// Ends a dialog and its window, as the host does when the person closes it.
-    void Close(int id) { m_dialogs.erase(id); }
-    void CloseAll() { m_dialogs.clear(); }
+    void Close(int id);
+    void CloseAll();
 
 private:
     CRPSDlgBase::WINDOW_MAKER m_maker;

@@ -37,6 +37,7 @@ public:
     [[nodiscard]] int SetYield(double axial, HINGE_SIDE side, double yield);
 
     double m_newForce = 0.0; // what a window's button adds
+    T_UNITS m_units;         // of the forces and strengths, for the heads
 
 private:
     int PutValue(double axial, const T_SIDES<T_SKEL_SIDE>& sides);

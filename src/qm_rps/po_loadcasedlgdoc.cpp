@@ -12,7 +12,7 @@ constexpr auto kLit = RULE_TEXT::Literal;
 constexpr T_RULE_HEAD kNameTaken{"IDS_QM_UI_POLC_NAME_TAKEN", kLit, nullptr, nullptr, "name"};
 constexpr T_RULE_HEAD kNoNode{"IDS_QM_UI_POLC_NO_NODE", kLit, nullptr, nullptr, "controlNode"};
 constexpr T_RULE_HEAD kNoResult{"IDS_QM_UI_POLC_NO_RESULT", kLit, nullptr, nullptr, "controlNode"};
-constexpr T_RULE_HEAD kNoControl{"IDS_QM_UI_POLC_NO_CONTROL", kLit, nullptr, nullptr, "control"};
+constexpr T_RULE_HEAD kNoControl{"IDS_QM_UI_POLC_NO_CONTROL", kLit, nullptr, nullptr, "hasControl"};
 
 // Kinds of pattern rows.
 constexpr int kStatic = 0, kAcceleration = 1;

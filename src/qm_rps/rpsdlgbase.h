@@ -36,6 +36,8 @@ public:
     void ShowWindow();
     void RefreshWindow();
     bool HasWindow() const { return m_window != nullptr; }
+    /// Before the dialog goes: its window reads it to the last.
+    void DestroyWindow() { m_window.reset(); }
 
     std::vector<T_FINDING> Findings() const override { return {}; }
 
@@ -46,5 +48,5 @@ protected:
 
 private:
     CDBDoc* m_doc = nullptr;
-    std::unique_ptr<IRPSWindow> m_window; // last: it reads the rest
+    std::unique_ptr<IRPSWindow> m_window;
 };

@@ -46,6 +46,7 @@ int EditAxialForces(const T_SERVICE_REQUEST& request)
     if (!rows) return Assert(__LINE__);
     CPO_HingeSkcvTabFemaAxialDlg dialog;
     dialog.SetView(CurrentView());
+    if (CDBDoc* doc = CDBDoc::GetDocPoint()) dialog.m_units = doc->Unit().Units();
     if (!dialog.Data2Dlg(*rows) || !dialog.DoModal()) return 0;
     CServiceAgencyRps::T_AXIAL_VALUES old;
     for (const T_SKEL_AXIAL& row : *rows)

@@ -16,8 +16,8 @@ void AddStoreys(CDBDoc& doc, SSReportInfoRW& out)
         row.key = key;
         row.name = storey.name;
         row.height = ShortFromSi(storey.height, units, kDimLength);
-        elevation += storey.height;
-        row.elevation = ShortFromSi(elevation, units, kDimLength);
+        elevation += row.height; // in the shown units: 3 x 168 is 504
+        row.elevation = elevation;
         row.nodes = storey.nodes;
         for (const int id : storey.nodes) {
             T_NODE_D node;
