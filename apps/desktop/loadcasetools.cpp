@@ -17,6 +17,7 @@
 #include "qm_ui/loadcaseview.h"
 
 #include <QEvent>
+#include <QTabWidget>
 #include <QTimer>
 
 namespace {
@@ -139,6 +140,14 @@ void FillItem(CMainWindow& main, CPO_LoadCaseDlg& dialog)
     dialog.SetDoc(&main.Doc());
 }
 
+/// Its second page.
+std::unique_ptr<QWidget> ShowPatterns(std::unique_ptr<QWidget> window)
+{
+    for (QTabWidget* tabs : window->findChildren<QTabWidget*>())
+        tabs->setCurrentIndex(1);
+    return window;
+}
+
 /// A new case with rules that are not kept.
 void FillNew(CMainWindow& main, CPO_LoadCaseDlg& dialog)
 {
@@ -165,7 +174,10 @@ std::vector<T_WINDOW_EXAMPLE> LoadCaseWindowExamples()
 {
     constexpr const char* kFrame = "rc-frame-3-storey";
     constexpr const char* kHinges = "hinge-library";
+    T_WINDOW_EXAMPLE pattern = ExampleOf<CPO_LoadCaseDlg>("loadcase-pattern", kFrame, FillNew);
+    pattern.make = [make = pattern.make](CMainWindow& main) { return ShowPatterns(make(main)); };
     return {ExampleOf<CPO_LoadCaseDlg>("loadcase-item", kHinges, FillItem),
+            pattern,
             ExampleOf<CPO_LoadCaseDlg>("loadcase-new", kFrame, FillNew),
             ExampleOf<CPO_LoadCaseListDlg>("loadcase-list", kFrame,
                                            [](CMainWindow& main, CPO_LoadCaseListDlg& dialog) {

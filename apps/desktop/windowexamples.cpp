@@ -13,8 +13,12 @@ std::vector<T_WINDOW_EXAMPLE> WindowExamples()
         (void)main.Frame().Show(sources.back(), sources.back().steps);
         return nullptr;
     };
-    return {{"main-empty", ""},
-            {"main-pushover", "rc-frame-3-storey", pushover},
-            {"main-bridge", "cable-stayed-bridge"},
-            {"main-space", "space-frame-3d"}};
+    std::vector<T_WINDOW_EXAMPLE> all{{"main-empty", ""},
+                                      {"main-pushover", "rc-frame-3-storey", pushover},
+                                      {"main-bridge", "cable-stayed-bridge"},
+                                      {"main-space", "space-frame-3d"}};
+    for (const auto& part : {PushoverWindowExamples(), LoadCaseWindowExamples(),
+                             HingeWindowExamples(), UlfWindowExamples()})
+        all.insert(all.end(), part.begin(), part.end());
+    return all;
 }

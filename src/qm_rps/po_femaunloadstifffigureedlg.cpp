@@ -14,9 +14,9 @@ std::vector<T_FIGURE_CURVE> CPO_FEMAUnloadStiffFigureEDlg::Curves() const
     std::vector<T_FIGURE_CURVE> curves{
         {MMSGFunction::GetValue("IDS_QM_UI_FIGURE_FULL_LOOP"), DegradedLoop(kDuctility, 1.0, 0.0)}};
     for (const double factor : kFactors)
-        curves.push_back(
-            {MMSGFunction::Format("IDS_QM_UI_FIGURE_FACTOR", {FormatText("%+.0f", factor + 0.0)}),
-             DegradedLoop(kDuctility, kEnergy, factor)});
+        curves.push_back({MMSGFunction::Format("IDS_QM_UI_FIGURE_FACTOR",
+                                               {factor == 0.0 ? "0" : FormatText("%+.0f", factor)}),
+                          DegradedLoop(kDuctility, kEnergy, factor)});
     return curves;
 }
 

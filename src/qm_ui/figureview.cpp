@@ -12,11 +12,16 @@ using zql::lib::MMSGFunction;
 
 namespace {
 
-constexpr QSize kFigureSize{820, 640}, kAxialSize{640, 420};
+constexpr double kLowest = 1.3, kLegendRow = 0.15; // of the y axis: room for the legend
+constexpr int kPictureHeight = 530;
+constexpr QSize kFigureSize{820, 660}, kAxialSize{640, 420};
+constexpr double kFirstWidth = 3.0, kOtherWidth = 1.6; // of the curves, px
 
 void BuildFigure(CFormView& form, const CFemaFigureDlg& figure)
 {
-    form.Picture([&figure] { return FigurePlot(figure); }).name = "figure";
+    CFormField& picture = form.Picture([&figure] { return FigurePlot(figure); });
+    picture.name = "figure";
+    picture.widget->setMaximumHeight(kPictureHeight); // the text below stays in sight
     form.Note(KeyText(figure.TextKey()));
 }
 
@@ -102,10 +107,15 @@ T_PLOT FigurePlot(const CFemaFigureDlg& figure)
     plot.title = MMSGFunction::GetValue(figure.TitleKey());
     plot.x.title = MMSGFunction::GetValue("IDS_QM_UI_FIGURE_X");
     plot.y.title = MMSGFunction::GetValue("IDS_QM_UI_FIGURE_Y");
-    for (const T_FIGURE_CURVE& curve : figure.Curves()) {
+    const std::vector<T_FIGURE_CURVE> curves = figure.Curves();
+    plot.y.range =
+        T_PLOT_RANGE{-kLowest, kLowest + kLegendRow * static_cast<double>(curves.size())};
+    for (const T_FIGURE_CURVE& curve : curves) {
         T_PLOT_SERIES series;
         series.name = curve.name;
         series.marker = PLOT_MARKER::None;
+        series.width = plot.series.empty() ? kFirstWidth : kOtherWidth;
+        if (curves.size() == 2) series.line = PLOT_LINE::Solid; // told by width and colour
         for (const T_FIGURE_POINT& p : curve.points) {
             series.x.push_back(p.x);
             series.y.push_back(p.y);

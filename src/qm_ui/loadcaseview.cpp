@@ -4,13 +4,14 @@
 #include "qm_rps/po_loadcasedlg.h"
 #include "qm_rps/po_loadcaselistdlg.h"
 #include "qm_rps/po_selectloadcasedlg.h"
+#include "qm_rps/recordtable.h"
 
 #include <algorithm>
 
 namespace {
 
 using D = CPO_LoadCaseDlg;
-constexpr QSize kItemSize{980, 460}, kListSize{720, 380};
+constexpr QSize kItemSize{640, 0}, kListSize{720, 380};
 constexpr int kByDisplacement = 1, kByForce = 2; // increment methods
 constexpr int kFollowsFunction = 2;              // increment option
 
@@ -54,10 +55,11 @@ std::function<std::vector<std::string>()> Directions(std::size_t count)
     };
 }
 
-TextFn LengthUnit(const D& d)
+/// With the unit in the caption, which is hidden with its field.
+TextFn LengthCaption(const D& d, const char* key)
 {
-    return [&d] {
-        return d.Doc() ? std::string(NameOf(d.Doc()->Unit().Units().length)) : std::string();
+    return [&d, key] {
+        return HeadWithUnit(key, kDimLength, d.Doc() ? d.Doc()->Unit().Units() : T_UNITS());
     };
 }
 
@@ -82,16 +84,14 @@ void BuildForce(CFormView& form, D& d)
                     [&d] { return d.FunctionNames(); });
     list.name = "control.incrementFunction";
     list.shown = follows;
-    CFormField& ratio =
-        form.Number(KeyText("IDS_QM_UI_POLC_RATIO"),
-                    Control(d, &T_POLC_CONTROL::stiffnessRatioLimit), PlainLabel("-"));
+    CFormField& ratio = form.Number(KeyText("IDS_QM_UI_POLC_RATIO"),
+                                    Control(d, &T_POLC_CONTROL::stiffnessRatioLimit));
     ratio.name = "control.stiffnessRatioLimit";
     ratio.shown = byForce;
     form.Flag(KeyText("IDS_QM_UI_POLC_ANGLE_ON"), Control(d, &T_POLC_CONTROL::generateStaticAngle))
         .shown = byForce;
     CFormField& angle =
-        form.Number(KeyText("IDS_PUSHOVER_STATIC_ANGLE_GEN"),
-                    Control(d, &T_POLC_CONTROL::staticAngle), KeyText("IDS_QM_UI_POLC_DEGREES"));
+        form.Number(KeyText("IDS_QM_UI_POLC_ANGLE"), Control(d, &T_POLC_CONTROL::staticAngle));
     angle.name = "control.staticAngle";
     angle.shown = byForce;
     angle.enabled = [&d] { return HasControl(d) && d.m_case.control->generateStaticAngle; };
@@ -104,13 +104,13 @@ void BuildDisplacement(CFormView& form, D& d)
     on.name = "masterOn";
     on.shown = [&d] { return ByDisplacement(d); };
     const auto isMaster = [&d] { return HasControl(d) && d.m_case.control->masterNodeControl; };
-    CFormField& master = form.Number(KeyText("IDS_QM_UI_POLC_MASTER"),
-                                     Control(d, &T_POLC_CONTROL::masterMaxDispl), LengthUnit(d));
+    CFormField& master = form.Number(LengthCaption(d, "IDS_QM_UI_POLC_MASTER"),
+                                     Control(d, &T_POLC_CONTROL::masterMaxDispl));
     master.name = "control.masterMaxDispl";
     master.shown = [&d] { return ByDisplacement(d); };
     master.enabled = isMaster;
-    CFormField& trans = form.Number(KeyText("IDS_QM_UI_POLC_TRANS"),
-                                    Control(d, &T_POLC_CONTROL::maxTransDispl), LengthUnit(d));
+    CFormField& trans = form.Number(LengthCaption(d, "IDS_QM_UI_POLC_TRANS"),
+                                    Control(d, &T_POLC_CONTROL::maxTransDispl));
     trans.name = "control.maxTransDispl";
     trans.shown = [&d] { return ByDisplacement(d); };
     trans.enabled = [isMaster] { return !isMaster(); };
@@ -237,18 +237,14 @@ void BuildPatterns(CFormView& form, D& d)
 
 void BuildItem(CFormView& form, D& d)
 {
-    form.Columns();
-    form.Group(KeyText("IDS_QM_UI_POLC_TITLE"));
+    form.Page(KeyText("IDS_QM_UI_POLC_TITLE"));
     BuildGeneral(form, d);
-    form.EndGroup();
     form.Group(KeyText("IDS_QM_UI_POLC_CONTROL"));
     BuildControl(form, d);
     form.EndGroup();
-    form.NextColumn();
-    form.Group(KeyText("IDS_QM_UI_POLC_PATTERNS"));
+    form.Page(KeyText("IDS_QM_UI_POLC_PATTERNS"));
     BuildPatterns(form, d);
-    form.EndGroup();
-    form.EndColumns();
+    form.EndPages();
 }
 
 // ---- list and selection -------------------------------------------------------------------------
