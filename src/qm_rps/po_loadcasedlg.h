@@ -33,7 +33,9 @@ public:
     /// The host chooses the load case to show. One that is not there changes nothing.
     void ExternalSetting(int key);
     /// Checks, then stores in the document as one edit that can be undone; evaluations follow a
-    /// new name. A new load case gets the next key. 0 with a message, the document as it was.
+    /// new name. A new load case gets the next key. 0 with a message, the document as it was; so
+    /// too where the stored case or the units have changed since it was read (another edit, an
+    /// undo, another model).
     int OnOK() override;
     /// A new load case of a document: with control data and a name that is free.
     static T_POLC_D MakeNew(CDBDoc& doc);
@@ -84,8 +86,12 @@ private:
     bool HasSelection() const;
     void DocFindings(std::vector<T_FINDING>& out) const;
     bool Store(CEditData& edit, const T_POLC_D& record);
+    bool IsAsRead();
+    void KeepRead();
 
     int m_key = 0;
+    T_POLC_D m_read; // in SI, when the case was read
+    T_UNITS m_units; // of the document then
     std::function<bool(int)> m_hasIncrementFunction;
     bool m_patternsEdited = false;
 };

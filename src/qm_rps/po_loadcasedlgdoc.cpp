@@ -55,6 +55,7 @@ int CPO_LoadCaseDlg::SetKey(int key)
     else if (!Doc()->Attr().GetPolc(key, record))
         return 0;
     m_key = key;
+    KeepRead();
     Data2Dlg(record);
     m_input = {};
     const std::vector<int> keys = LoadCaseKeys();
@@ -105,13 +106,15 @@ void CPO_LoadCaseDlg::DocFindings(std::vector<T_FINDING>& out) const
     const bool results = HasResults();
     report(results && !Doc()->Post().ExistNodePost(m_case.controlNode), kNoResult);
     report(!results && !m_case.control, kNoControl);
+    // A model without modes or load cases of its own names those of another solver.
     for (std::size_t i = 0; m_patternsEdited && i < m_case.patterns.size(); ++i) {
         const T_POLC_PATTERN& row = m_case.patterns[i];
         const std::string field = "patterns[" + std::to_string(i) + "]";
         const bool isMode = row.kind > kAcceleration;
         report(isMode && !model.modes.empty() && !model.modes.contains(row.number),
                {"IDS_QM_UI_POLC_NO_MODE", kLit, nullptr, nullptr, field.c_str()});
-        report(row.kind == kStatic && !model.loadCases.contains(row.number),
+        report(row.kind == kStatic && !model.loadCases.empty() &&
+                   !model.loadCases.contains(row.number),
                {"IDS_QM_UI_POLC_NO_CASE", kLit, nullptr, nullptr, field.c_str()});
     }
 }
@@ -132,18 +135,36 @@ bool CPO_LoadCaseDlg::Store(CEditData& edit, const T_POLC_D& record)
     return true;
 }
 
+void CPO_LoadCaseDlg::KeepRead()
+{
+    m_read = m_key == 0 ? T_POLC_D() : Doc()->Data().Model().pushovers.at(m_key);
+    m_units = Doc()->Unit().Units();
+}
+
+bool CPO_LoadCaseDlg::IsAsRead()
+{
+    const auto& cases = Doc()->Data().Model().pushovers;
+    const auto it = cases.find(m_key);
+    if (m_key != 0 && it == cases.end()) {
+        ShowMessage("IDS_QM_UI_POLC_GONE");
+        return false;
+    }
+    if (m_units == Doc()->Unit().Units() && (m_key == 0 || it->second == m_read)) return true;
+    ShowMessage("IDS_QM_UI_POLC_CHANGED");
+    return false;
+}
+
 int CPO_LoadCaseDlg::OnOK()
 {
     if (!Doc()) return CheckData();
-    if (m_key != 0 && !Doc()->Data().Model().pushovers.contains(m_key)) {
-        ShowMessage("IDS_QM_UI_POLC_GONE"); // deleted, or another model is open
-        return 0;
-    }
+    if (!IsAsRead()) return 0;
     T_POLC_D record;
     if (!Dlg2Data(record)) return 0;
     const int before = m_key;
-    if (Edit("IDS_QM_UI_TABLE_PUSHOVERS", [&](CEditData& edit) { return Store(edit, record); }))
+    if (Edit("IDS_QM_UI_TABLE_PUSHOVERS", [&](CEditData& edit) { return Store(edit, record); })) {
+        KeepRead();
         return 1;
+    }
     m_key = before;
     return 0;
 }

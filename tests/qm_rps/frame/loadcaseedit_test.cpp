@@ -60,6 +60,12 @@ const T_SPOIL kSpoils[] = {
 TEST_F(LoadCaseEdit, EveryRuleIsAskedOfTheDocumentToo)
 {
     Open("rc-frame-3-storey");
+    ASSERT_EQ(1, m_doc.Edit().Begin("load case"));
+    T_STLD_D load;
+    load.name = "dead";
+    ASSERT_EQ(1, m_doc.Edit().Put(1, load));
+    ASSERT_EQ(1, m_doc.Edit().Commit());
+    m_doc.Data().SetModified(false);
     const std::string before = Text();
     for (const T_SPOIL& s : kSpoils) {
         CPO_LoadCaseDlg dialog;
@@ -216,4 +222,23 @@ TEST_F(LoadCaseEdit, ANewCaseNeverInheritsTheResultsOfADeletedOne)
     list.m_selected = 1;
     ASSERT_EQ(1, list.OnCopy());
     EXPECT_EQ(0, m_doc.Post().SelectPushover(list.m_selected));
+}
+
+TEST_F(LoadCaseEdit, WhatHasChangedElsewhereIsNotOverwritten)
+{
+    Open("hinge-library");
+    CPO_LoadCaseDlg first, second;
+    Start(first);
+    Start(second);
+    first.m_case.name = "A";
+    second.m_case.name = "B";
+    ASSERT_EQ(1, first.OnOK());
+    EXPECT_EQ(0, second.OnOK());
+    EXPECT_EQ("IDS_QM_UI_POLC_CHANGED", LastMessage());
+    EXPECT_EQ("A", Model().pushovers.at(1).name);
+    first.m_case.name = "C"; // its own edit does not count
+    EXPECT_EQ(1, first.OnOK());
+    Open("rc-frame-3-storey"); // another model with a load case of that key
+    EXPECT_EQ(0, first.OnOK());
+    EXPECT_EQ("PX_MODE1", Model().pushovers.at(1).name);
 }
