@@ -124,6 +124,7 @@ int main(int argc, char** argv)
     AddCase(app, code);
     AddAnalyse(app, code);
     AddUlf(app, code);
+    AddReport(app, code);
     try {
         app.parse(argc, argv);
     } catch (const CLI::ParseError& e) {

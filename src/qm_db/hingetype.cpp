@@ -39,7 +39,7 @@ int ConvertIehpToPhgtFema(const T_IEHP_D& in, int component, T_PHGT_D& out)
     T_PHGT_D type;
     type.name = in.name;
     T_HINGE_COMPONENT& c = type.components[index];
-    c.active = true;
+    c.active = in.components[index].has_value(); // so that one that is not there stays so
     c.type = SKEL_TYPE::Fema;
     c.curves.I = c.curves.J = in.components[index].value_or(T_SKEL_FEMA{});
     out = std::move(type);
@@ -52,6 +52,10 @@ int ConvertPhgtToIehpFema(const T_PHGT_D& in, int component, T_IEHP_D& out)
     const auto index = static_cast<std::size_t>(component);
     const auto* curve = std::get_if<T_SKEL_FEMA>(&in.components[index].curves.I);
     if (!curve) return 0;
-    out.components[index] = *curve;
+    out.name = in.name;
+    if (in.components[index].active)
+        out.components[index] = *curve;
+    else
+        out.components[index].reset();
     return 1;
 }

@@ -89,6 +89,13 @@ bool HasNumber(std::span<const T_POLC_PATTERN> rows, int number)
 
 } // namespace
 
+CPO_LoadCaseDlg::CPO_LoadCaseDlg()
+    : m_hasIncrementFunction([this](int key) {
+          return Doc() && Doc()->Data().Model().incrementFunctions.contains(key);
+      })
+{
+}
+
 CPO_LoadCaseDlg::CPO_LoadCaseDlg(std::function<bool(int)> hasIncrementFunction)
     : m_hasIncrementFunction(std::move(hasIncrementFunction))
 {
@@ -123,6 +130,7 @@ std::vector<T_FINDING> CPO_LoadCaseDlg::Findings() const
     WalkRules(std::span<const T_RULE<C>>(kRules), check, {}, out);
     for (T_FINDING& f : out)
         if (f.messageKey == kAngle) f.ruleText = f.text += " >0"; // "%s >0"
+    if (Doc()) DocFindings(out);
     return out;
 }
 

@@ -1,13 +1,13 @@
 // Model of the pushover load case dialog: control and stop criteria, and the list of load patterns.
-// Lengths in the caller's units, angles in degrees. One class serves both dialogs of load cases.
+// Lengths in the caller's units, angles in degrees. With a document it edits one of its load cases
+// and stores it on OK; without one it checks what it is given.
 #pragma once
 
-#include "qm_db/records.h"
-#include "qm_rps/hingedialog.h"
+#include "qm_rps/rpsdlgbase.h"
 
 #include <functional>
 
-class CPO_LoadCaseDlg : public CHingeDialog {
+class CPO_LoadCaseDlg : public CRPSDlgBase {
 public:
     /// What is chosen and typed for a pattern row.
     struct T_PATTERN_INPUT {
@@ -18,8 +18,31 @@ public:
         double factor = 1.0;
     };
 
-    /// Tells whether the document has an increment function (T_POFC_D) of this key.
+    /// Works on the document that it is given.
+    CPO_LoadCaseDlg();
+    /// Works without one. Tells whether there is an increment function (T_POFC_D) of this key.
     explicit CPO_LoadCaseDlg(std::function<bool(int key)> hasIncrementFunction);
+
+    /// Takes the document and its first load case, or a new one where it has none.
+    void SetDoc(CDBDoc* doc) override;
+    /// Reads a load case of the document; 0: a new one, with the node at the top as control node.
+    /// 1 done; 0 there is no such one, all as it was.
+    [[nodiscard]] int SetKey(int key);
+    /// Key of the load case that is edited; 0: a new one.
+    int Key() const { return m_key; }
+    /// The host chooses the load case to show. One that is not there changes nothing.
+    void ExternalSetting(int key);
+    /// Checks, then stores in the document as one edit that can be undone; evaluations follow a
+    /// new name. A new load case gets the next key. 0 with a message, the document as it was; so
+    /// too where the stored case or the units have changed since it was read (another edit, an
+    /// undo, another model).
+    int OnOK() override;
+    /// A new load case of a document: with control data and a name that is free.
+    static T_POLC_D MakeNew(CDBDoc& doc);
+    /// Key of the next load case: no stored results wait under it.
+    static int NextKey(const CDBDoc& doc);
+    /// Whether the case has results. They hold in its direction, which then stays.
+    bool HasResults() const;
 
     void Data2Dlg(const T_POLC_D& data);
     /// Checks, then writes. 0: `data` as it was. Where patterns were edited, the master kind is
@@ -30,7 +53,10 @@ public:
     T_POLC_D m_case;
     int m_selected = -1; // index of the selected pattern row
 
-    /// Rules of the record that are not kept, in the order of the check; CheckData shows the first.
+    T_PATTERN_INPUT m_input; // what OnAddPattern and OnModifyPattern of a window take
+
+    /// Rules of the record that are not kept, in the order of the check, then those of the document
+    /// (free name, existing node, modes and load cases); CheckData shows the first.
     std::vector<T_FINDING> Findings() const override;
 
     /// What the row checks say of rows that are already stored.
@@ -44,10 +70,28 @@ public:
     /// Checks and replaces the selected row.
     [[nodiscard]] int OnModifyPattern(const T_PATTERN_INPUT& input);
     [[nodiscard]] int OnDeletePattern();
+    /// Chooses a row (-1: none) and takes it as input.
+    void SelectPattern(int row);
+
+    // Texts of a pattern row, and of what can be chosen for one.
+    static std::string KindText(int kind);
+    std::string NumberText(const T_POLC_PATTERN& row) const;
+    std::vector<std::string> LoadCaseNames() const;
+    std::vector<std::string> FunctionNames() const;
+    /// Keys in the order of these names.
+    std::vector<int> LoadCaseKeys() const;
+    std::vector<int> FunctionKeys() const;
 
 private:
     bool HasSelection() const;
+    void DocFindings(std::vector<T_FINDING>& out) const;
+    bool Store(CEditData& edit, const T_POLC_D& record);
+    bool IsAsRead();
+    void KeepRead();
 
+    int m_key = 0;
+    T_POLC_D m_read; // in SI, when the case was read
+    T_UNITS m_units; // of the document then
     std::function<bool(int)> m_hasIncrementFunction;
     bool m_patternsEdited = false;
 };

@@ -1,0 +1,225 @@
+// The load case dialog on a document: which case it edits, what the document asks of it, storing.
+#include "qm_base/msgfunction.h"
+#include "qm_rps/po_loadcasedlg.h"
+
+#include <algorithm>
+
+using zql::lib::MMSGFunction;
+
+namespace {
+
+constexpr auto kLit = RULE_TEXT::Literal;
+constexpr T_RULE_HEAD kNameTaken{"IDS_QM_UI_POLC_NAME_TAKEN", kLit, nullptr, nullptr, "name"};
+constexpr T_RULE_HEAD kNoNode{"IDS_QM_UI_POLC_NO_NODE", kLit, nullptr, nullptr, "controlNode"};
+constexpr T_RULE_HEAD kNoResult{"IDS_QM_UI_POLC_NO_RESULT", kLit, nullptr, nullptr, "controlNode"};
+constexpr T_RULE_HEAD kNoControl{"IDS_QM_UI_POLC_NO_CONTROL", kLit, nullptr, nullptr, "hasControl"};
+
+// Kinds of pattern rows.
+constexpr int kStatic = 0, kAcceleration = 1;
+
+template <class T>
+std::vector<std::string> NamesOf(const T_TABLE<T>& table)
+{
+    std::vector<std::string> names;
+    for (const auto& [key, record] : table)
+        names.push_back(std::to_string(key) + " : " + record.name);
+    return names;
+}
+
+/// The first node of the top storey, else the node at the top.
+int TopNode(const T_MODEL& model)
+{
+    for (auto it = model.storeys.rbegin(); it != model.storeys.rend(); ++it)
+        if (!it->second.nodes.empty()) return it->second.nodes.front();
+    const auto top =
+        std::ranges::max_element(model.nodes, {}, [](const auto& n) { return n.second.xyz[2]; });
+    return top == model.nodes.end() ? 0 : top->first;
+}
+
+} // namespace
+
+void CPO_LoadCaseDlg::SetDoc(CDBDoc* doc)
+{
+    CRPSDlgBase::SetDoc(doc);
+    if (!doc) return;
+    const auto& cases = doc->Data().Model().pushovers;
+    (void)SetKey(cases.empty() ? 0 : cases.begin()->first); // there is such one
+}
+
+int CPO_LoadCaseDlg::SetKey(int key)
+{
+    T_POLC_D record;
+    if (!Doc()) return 0;
+    if (key == 0)
+        record = MakeNew(*Doc());
+    else if (!Doc()->Attr().GetPolc(key, record))
+        return 0;
+    m_key = key;
+    KeepRead();
+    Data2Dlg(record);
+    m_input = {};
+    const std::vector<int> keys = LoadCaseKeys();
+    if (!keys.empty()) m_input.loadCase = keys.front();
+    return 1;
+}
+
+void CPO_LoadCaseDlg::ExternalSetting(int key)
+{
+    if (SetKey(key)) RefreshWindow();
+}
+
+T_POLC_D CPO_LoadCaseDlg::MakeNew(CDBDoc& doc)
+{
+    T_POLC_D record;
+    int number = 1, taken = 0;
+    do
+        record.name = MMSGFunction::Format("IDS_QM_UI_NEW_NAME", {std::to_string(number++)});
+    while (doc.Attr().FindPolc(record.name, taken));
+    record.controlNode = TopNode(doc.Data().Model());
+    record.control.emplace();
+    return record;
+}
+
+int CPO_LoadCaseDlg::NextKey(const CDBDoc& doc)
+{
+    const T_MODEL_CONTENT& content = doc.Data().Content();
+    const auto last = [](const auto& table) { return table.empty() ? 0 : table.rbegin()->first; };
+    return 1 + std::max({last(content.model.pushovers), last(content.model.poverSteps),
+                         last(content.results)});
+}
+
+bool CPO_LoadCaseDlg::HasResults() const
+{
+    return m_key != 0 && Doc() && Doc()->Post().SelectPushover(m_key);
+}
+
+/// What keeps the model whole: its file can be read again, its results are still understood.
+void CPO_LoadCaseDlg::DocFindings(std::vector<T_FINDING>& out) const
+{
+    const T_MODEL& model = Doc()->Data().Model();
+    const auto report = [&](bool wrong, const T_RULE_HEAD& head) {
+        if (wrong) out.push_back(FindingOf(head, {}));
+    };
+    int other = 0;
+    report(Doc()->Attr().FindPolc(m_case.name, other) && other != m_key, kNameTaken);
+    report(!model.nodes.contains(m_case.controlNode), kNoNode);
+    const bool results = HasResults();
+    report(results && !Doc()->Post().ExistNodePost(m_case.controlNode), kNoResult);
+    report(!results && !m_case.control, kNoControl);
+    // A model without modes or load cases of its own names those of another solver.
+    for (std::size_t i = 0; m_patternsEdited && i < m_case.patterns.size(); ++i) {
+        const T_POLC_PATTERN& row = m_case.patterns[i];
+        const std::string field = "patterns[" + std::to_string(i) + "]";
+        const bool isMode = row.kind > kAcceleration;
+        report(isMode && !model.modes.empty() && !model.modes.contains(row.number),
+               {"IDS_QM_UI_POLC_NO_MODE", kLit, nullptr, nullptr, field.c_str()});
+        report(row.kind == kStatic && !model.loadCases.empty() &&
+                   !model.loadCases.contains(row.number),
+               {"IDS_QM_UI_POLC_NO_CASE", kLit, nullptr, nullptr, field.c_str()});
+    }
+}
+
+bool CPO_LoadCaseDlg::Store(CEditData& edit, const T_POLC_D& record)
+{
+    T_POLC_D before;
+    if (m_key != 0 && Doc()->Attr().GetPolc(m_key, before) && before.name != record.name)
+        for (const auto& [key, stored] : Doc()->Data().Model().evaluations) {
+            T_EVAL_D eval;
+            if (stored.push != before.name || !Doc()->Attr().GetEval(key, eval)) continue;
+            eval.push = record.name;
+            if (!edit.Put(key, std::move(eval))) return false;
+        }
+    const int key = m_key != 0 ? m_key : NextKey(*Doc());
+    if (!edit.Put(key, record)) return false;
+    m_key = key;
+    return true;
+}
+
+void CPO_LoadCaseDlg::KeepRead()
+{
+    m_read = m_key == 0 ? T_POLC_D() : Doc()->Data().Model().pushovers.at(m_key);
+    m_units = Doc()->Unit().Units();
+}
+
+bool CPO_LoadCaseDlg::IsAsRead()
+{
+    const auto& cases = Doc()->Data().Model().pushovers;
+    const auto it = cases.find(m_key);
+    if (m_key != 0 && it == cases.end()) {
+        ShowMessage("IDS_QM_UI_POLC_GONE");
+        return false;
+    }
+    if (m_units == Doc()->Unit().Units() && (m_key == 0 || it->second == m_read)) return true;
+    ShowMessage("IDS_QM_UI_POLC_CHANGED");
+    return false;
+}
+
+int CPO_LoadCaseDlg::OnOK()
+{
+    if (!Doc()) return CheckData();
+    if (!IsAsRead()) return 0;
+    T_POLC_D record;
+    if (!Dlg2Data(record)) return 0;
+    const int before = m_key;
+    if (Edit("IDS_QM_UI_TABLE_PUSHOVERS", [&](CEditData& edit) { return Store(edit, record); })) {
+        KeepRead();
+        return 1;
+    }
+    m_key = before;
+    return 0;
+}
+
+void CPO_LoadCaseDlg::SelectPattern(int row)
+{
+    m_selected = row >= 0 && row < static_cast<int>(m_case.patterns.size()) ? row : -1;
+    if (m_selected < 0) return;
+    const T_POLC_PATTERN& chosen = m_case.patterns[static_cast<std::size_t>(row)];
+    m_input.kind = chosen.kind;
+    m_input.factor = chosen.factor;
+    if (chosen.kind == kStatic)
+        m_input.loadCase = chosen.number;
+    else if (chosen.kind == kAcceleration)
+        m_input.directionIndex = chosen.number - 1;
+    else
+        m_input.mode = chosen.number;
+}
+
+// ---- texts --------------------------------------------------------------------------------------
+
+std::string CPO_LoadCaseDlg::KindText(int kind)
+{
+    static constexpr std::array<const char*, 4> kKeys{
+        "IDS_PUSHOVER_Static_Load_Cases", "IDS_PUSHOVER_Uniform_Acceleration",
+        "IDS_PUSHOVER_Mode_Shape", "IDS_PUSHOVER_Mode_Shape_Story_Mass"};
+    const auto at = static_cast<std::size_t>(kind);
+    return at < kKeys.size() ? MMSGFunction::GetValue(kKeys[at]) : std::string();
+}
+
+std::string CPO_LoadCaseDlg::NumberText(const T_POLC_PATTERN& row) const
+{
+    const std::string number = std::to_string(row.number);
+    if (row.kind == kAcceleration) {
+        const auto d = static_cast<std::size_t>(row.number - 1);
+        return d < kDirectionNames.size() ? kDirectionNames[d] : number;
+    }
+    if (row.kind != kStatic) return MMSGFunction::Format("IDS_PUSHOVER_Mode__d", {number});
+    T_STLD_D load;
+    return Doc() && Doc()->Attr().GetStld(row.number, load) ? number + " : " + load.name : number;
+}
+
+std::vector<std::string> CPO_LoadCaseDlg::LoadCaseNames() const
+{
+    return Doc() ? NamesOf(Doc()->Data().Model().loadCases) : std::vector<std::string>();
+}
+std::vector<std::string> CPO_LoadCaseDlg::FunctionNames() const
+{
+    return Doc() ? NamesOf(Doc()->Data().Model().incrementFunctions) : std::vector<std::string>();
+}
+std::vector<int> CPO_LoadCaseDlg::LoadCaseKeys() const
+{
+    return Doc() ? Doc()->Attr().GetStldKeys() : std::vector<int>();
+}
+std::vector<int> CPO_LoadCaseDlg::FunctionKeys() const
+{
+    return Doc() ? Doc()->Attr().GetKeys<T_POFC_D>() : std::vector<int>();
+}

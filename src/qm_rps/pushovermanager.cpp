@@ -1,0 +1,8 @@
+#include "qm_rps/pushovermanager.h"
+
+#include "qm_rps/docmodule.h"
+
+CPushoverManager* CPushoverManager::Current()
+{
+    return CurrentDocModule<CPushoverManager>("src/qm_rps/pushovermanager");
+}

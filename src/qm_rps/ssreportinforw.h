@@ -1,0 +1,53 @@
+// The report data set: what a seismic report says of a model. Plain data, in the document's current
+// units; accelerations in g, damping in per cent.
+#pragma once
+
+#include "qm_db/dbdoc.h"
+#include "qm_rps/pushevaluation.h"
+
+/// A storey, bottom to top.
+struct T_REPORT_STOREY {
+    int key = 0;
+    std::string name;
+    double height = 0.0;          // of the storey
+    double elevation = 0.0;       // of the level, above the lowest storey's foot
+    std::array<double, 3> mass{}; // lumped masses of the level's nodes in X, Y, Z
+    std::vector<int> nodes;
+};
+
+struct T_REPORT_STEP {
+    int step = 0;
+    double loadFactor = 0.0;
+    double baseReaction = 0.0, controlDisplacement = 0.0; // in the control direction
+    std::vector<T_STOREY_DRIFT> drifts;                   // empty where there are no storeys
+};
+
+/// A limit state with the step of the curve where it is reached; -2: not found.
+struct T_REPORT_LIMIT {
+    std::string name; // "DL", "SLV" ...
+    int step = -2;
+};
+
+/// A pushover load case; without steps where it has no results.
+struct T_REPORT_PUSH {
+    int key = 0;
+    std::string name;
+    int controlNode = 0;
+    int direction = 1; // 1 to 6: DX to RZ
+    std::vector<T_REPORT_STEP> steps;
+    std::vector<T_REPORT_LIMIT> limitStates; // those that the model keeps
+};
+
+struct SSReportInfoRW {
+    std::string title;
+    T_UNITS units;
+    double gravity = 0.0;
+    std::vector<T_REPORT_STOREY> storeys;
+    std::vector<T_REPORT_PUSH> pushovers;
+    std::vector<T_PUSH_EVALUATION> evaluations; // performance points and target displacements
+};
+
+/// Fills a data set from the model: every storey, load case, step and evaluation. The model is not
+/// changed. 1 done; 0 results can't be read or an evaluation names what does not exist (error says
+/// which), out as it was.
+[[nodiscard]] int BuildReportInfo(CDBDoc& doc, SSReportInfoRW& out, std::string& error);
