@@ -8,6 +8,8 @@
 
 #include <CLI/CLI.hpp>
 
+#include <cstdio>
+
 namespace {
 
 EXIT_CODE RunReportData(const std::string& file, const std::string& out)
@@ -16,7 +18,10 @@ EXIT_CODE RunReportData(const std::string& file, const std::string& out)
     if (const EXIT_CODE code = OpenInput(doc, file); code != EXIT_CODE::Done) return code;
     IRPSInterfaceImpl report;
     if (!report.BuildReport()) return Complain(EXIT_CODE::BadInput, file + ": " + report.Error());
-    return WriteOutput(out, ReportJson(*CRPSManager::Current()->ReportInfo()));
+    const SSReportInfoRW& data = *CRPSManager::Current()->ReportInfo();
+    const EXIT_CODE code = WriteOutput(out, ReportJson(data));
+    if (code == EXIT_CODE::Done && out != "-") std::printf("%s\n", out.c_str());
+    return code;
 }
 
 } // namespace

@@ -217,10 +217,7 @@ TEST_F(LoadCaseWindows, TheSelectionGivesTheChosenCase)
     ASSERT_TRUE(Open("rc-frame-3-storey"));
     int key = 0;
     {
-        CAnswers answers({[](QWidget& window) { // none chosen: refused
-                              auto& dialog = dynamic_cast<QDialog&>(window);
-                              QTimer::singleShot(0, &window, [&dialog] { dialog.accept(); });
-                          },
+        CAnswers answers({CAnswers::Accept(), // none chosen: refused
                           CAnswers::Accept(), // its message
                           CAnswers::Fill([](CDialogWindow& w) {
                               CGridView& rows = Table(w, "rows");

@@ -94,7 +94,7 @@ TEST_F(UlfWindows, AnItemWithoutASolutionIsExplained)
                  }},
                 {kItem, Cancel}});
     OpenRecord(EXPLORER_TABLE::UlfItems, 4);
-    ASSERT_EQ(1, play.m_texts.size());
+    ASSERT_EQ(1, play.m_texts.size()) << play.m_texts.join('|').toStdString();
     EXPECT_TRUE(play.m_texts[0].contains("IMPOSSIBLE"));
     EXPECT_FALSE(m_main->Doc().Undo().CanUndo());
 }

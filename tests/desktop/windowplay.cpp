@@ -53,7 +53,8 @@ void CPlay::Look()
 
 void CPlay::Answer(QMessageBox& box)
 {
-    m_texts << box.text();
+    if (m_box != &box) m_texts << box.text(); // a click before the box is laid out misses
+    m_box = &box;
     QAbstractButton* button = box.button(m_answer);
     Click(button ? button : box.button(QMessageBox::Ok));
 }

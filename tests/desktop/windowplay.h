@@ -1,6 +1,8 @@
 // Plays scenes on the windows that come up, and looks at what they show.
 #pragma once
 
+#include <QPointer>
+
 #include "desktoptest.h"
 
 #include "qm_ui/plotdata.h"
@@ -36,6 +38,7 @@ private:
 
     std::vector<T_SCENE> m_scenes;
     std::size_t m_next = 0;
+    QPointer<QMessageBox> m_box; // answered last
     bool m_pending = false;
     QTimer m_timer;
     QElapsedTimer m_clock;
