@@ -8,15 +8,23 @@
 
 std::vector<T_WINDOW_EXAMPLE> WindowExamples()
 {
-    const auto pushover = [](CMainWindow& main) -> std::unique_ptr<QWidget> {
-        const auto& sources = main.Frame().Sources();
-        (void)main.Frame().Show(sources.back(), sources.back().steps);
-        return nullptr;
+    using KIND = T_SHAPE_SOURCE::KIND;
+    const auto shown = [](KIND kind) {
+        return [kind](CMainWindow& main) -> std::unique_ptr<QWidget> {
+            if (kind == KIND::Static) (void)main.Desktop().frame.OnAnalyse(0, {});
+            main.Refresh();
+            for (const T_SHAPE_SOURCE& source : main.Frame().Sources()) {
+                if (source.kind != kind) continue;
+                (void)main.Frame().Show(source, source.steps);
+                break;
+            }
+            return nullptr;
+        };
     };
     std::vector<T_WINDOW_EXAMPLE> all{{"main-empty", ""},
-                                      {"main-pushover", "rc-frame-3-storey", pushover},
-                                      {"main-bridge", "cable-stayed-bridge"},
-                                      {"main-space", "space-frame-3d"}};
+                                      {"main-pushover", "rc-frame-3-storey", shown(KIND::Pushover)},
+                                      {"main-bridge", "cable-stayed-bridge", shown(KIND::Static)},
+                                      {"main-space", "space-frame-3d", shown(KIND::Static)}};
     for (auto& part : {PushoverWindowExamples(), LoadCaseWindowExamples(), HingeWindowExamples(),
                        UlfWindowExamples()})
         all.insert(all.end(), part.begin(), part.end());

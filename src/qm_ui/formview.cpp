@@ -78,7 +78,9 @@ void CFormView::Group(TextFn title)
 
 void CFormView::EndGroup()
 {
+    const bool grows = BoxGrows();
     m_boxes.pop_back();
+    if (grows) LetGrow();
 }
 
 void CFormView::Columns()
@@ -93,16 +95,30 @@ void CFormView::Columns()
     NextColumn();
 }
 
+/// Whether something in the innermost box takes the room that is left.
+bool CFormView::BoxGrows() const
+{
+    const QGridLayout* const grid = m_boxes.back().grid;
+    for (int row = 0; grid && row < grid->rowCount(); ++row)
+        if (grid->rowStretch(row) > 0) return true;
+    return false;
+}
+
+/// What holds a box that grows has to grow with it.
+void CFormView::LetGrow()
+{
+    T_BOX& box = m_boxes.back();
+    if (box.grid) box.grid->setRowStretch(box.row - 1, 1);
+}
+
 /// Fields stay together at the top where nothing grows.
 void CFormView::CloseColumn()
 {
-    if (QGridLayout* grid = m_boxes.back().grid) {
-        bool grows = false;
-        for (int row = 0; row < grid->rowCount(); ++row)
-            grows = grows || grid->rowStretch(row) > 0;
-        if (!grows) grid->setRowStretch(m_boxes.back().row, 1);
-    }
+    const bool grows = BoxGrows();
+    if (QGridLayout* grid = m_boxes.back().grid; grid && !grows)
+        grid->setRowStretch(m_boxes.back().row, 1);
     m_boxes.pop_back();
+    m_boxes.back().grows = m_boxes.back().grows || grows;
 }
 
 void CFormView::NextColumn(int stretch)
@@ -117,7 +133,9 @@ void CFormView::NextColumn(int stretch)
 void CFormView::EndColumns()
 {
     CloseColumn();
+    const bool grows = m_boxes.back().grows;
     m_boxes.pop_back();
+    if (grows) LetGrow();
 }
 
 void CFormView::Space()

@@ -87,8 +87,9 @@ private:
         int row = 0;
         QBoxLayout* columns = nullptr; // of a row of columns
         QTabWidget* tabs = nullptr;
-        int cells = 0; // columns of a table of fields
-        int cell = 0;  // the next one
+        bool grows = false; // of a row of columns: one of them does
+        int cells = 0;      // columns of a table of fields
+        int cell = 0;       // the next one
     };
     struct T_TITLE {
         TextFn text;
@@ -98,6 +99,8 @@ private:
         std::function<bool()> shown{};
     };
     T_BOX NewBox(QWidget* host);
+    bool BoxGrows() const;
+    void LetGrow();
     void CloseColumn();
     void AddWide(QWidget* widget);
     CFormField& Add(TextFn caption, std::unique_ptr<CFormField> field, const TextFn& unit = {});
