@@ -7,6 +7,9 @@
 #include <QApplication>
 #include <QDir>
 #include <QPixmap>
+#include <QSettings>
+#include <QStandardPaths>
+#include <QTemporaryDir>
 
 #include <cstdio>
 
@@ -40,6 +43,11 @@ bool WriteOne(const T_WINDOW_EXAMPLE& example, const QString& file, const QStrin
 int WriteWindowPictures(const QString& folder, const QString& examples)
 {
     if (!QDir().mkpath(folder)) return 1;
+    // The person's settings and recent files stay as they are.
+    const QTemporaryDir settings;
+    QSettings::setDefaultFormat(QSettings::IniFormat);
+    QSettings::setPath(QSettings::IniFormat, QSettings::UserScope, settings.path());
+    QStandardPaths::setTestModeEnabled(true);
     int failed = 0;
     for (const T_WINDOW_EXAMPLE& example : WindowExamples())
         for (const char* language : {"en", "it"}) {
