@@ -3,3 +3,6 @@
 
 /// Makes it with the first call.
 void NeedBenchApp();
+
+/// Ends it, before the libraries that it uses go; windows must be gone by then.
+void EndBenchApp();

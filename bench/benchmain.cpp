@@ -1,6 +1,10 @@
 // Runs the benchmarks and prints the ratios that the project holds itself to.
 #include "ratios.h"
 
+#ifdef QM_UI
+#include "benchapp.h"
+#endif
+
 #include <benchmark/benchmark.h>
 
 #include <cstdio>
@@ -58,5 +62,8 @@ int main(int argc, char** argv)
         std::printf("%-58s %9.3f %9.3f %s\n", r.what.c_str(), value, r.limit,
                     value <= r.limit ? "" : "  <-- over");
     }
+#ifdef QM_UI
+    EndBenchApp();
+#endif
     return 0;
 }

@@ -59,6 +59,7 @@ T_MODEL_CONTENT Content()
     return content;
 }
 
+/// The pane with 20,000 elements.
 struct T_BENCH {
     CDBDoc doc;
     CFrameScene scene{doc};
@@ -75,30 +76,24 @@ struct T_BENCH {
     }
 };
 
-/// The pane with 20,000 elements, made with the first benchmark that needs it.
-T_BENCH& Bench()
-{
-    static T_BENCH bench;
-    return bench;
-}
-
 void FrameStep(benchmark::State& state)
 {
-    CFramePane& pane = *Bench().pane;
+    T_BENCH bench;
+    CFramePane& pane = *bench.pane;
     int step = 1;
     for (auto _ : state) {
         pane.SetStep(step);
         pane.View().repaint();
         step = step % kSteps + 1;
     }
-    if (Bench().scene.Scene().lines.size() < 20000) state.SkipWithError("not enough elements");
+    if (bench.scene.Scene().lines.size() < 20000) state.SkipWithError("not enough elements");
 }
 
 /// The same lines on a picture of the same size, places given.
 void FrameLinesOnce(benchmark::State& state)
 {
-    const T_BENCH& bench = Bench();
-    const T_FRAME_SCENE& scene = Bench().scene.Scene();
+    T_BENCH bench;
+    const T_FRAME_SCENE& scene = bench.scene.Scene();
     std::vector<QLineF> lines;
     const double rad = std::acos(-1.0) / 4.0, px = 3.2;
     const auto place = [&](const T_SCENE_NODE& node) {
