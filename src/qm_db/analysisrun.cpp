@@ -111,7 +111,8 @@ int CAnalysisRun::Keep(T_ANALYSIS_RESULTS results)
 }
 
 int CAnalysisRun::Compute(const T_MODEL& model, const T_ANALYSIS_OPTIONS& options,
-                          T_ANALYSIS_RESULTS& out, T_ANALYSIS_ERROR& error)
+                          const std::shared_ptr<IStagedResult>& before, T_ANALYSIS_RESULTS& out,
+                          T_ANALYSIS_ERROR& error)
 {
     T_RUN run{model, options, CAnalysisModel(model), {}, options.cases, 0};
     if (options.allCases) {
@@ -121,17 +122,18 @@ int CAnalysisRun::Compute(const T_MODEL& model, const T_ANALYSIS_OPTIONS& option
     }
     const bool hasStages = options.stages && !model.stages.empty();
     CStagedAnalysis staged(model);
-    const std::size_t before =
+    const std::size_t parts =
         run.cases.size() + static_cast<std::size_t>(std::max(options.modes, 0));
-    run.total = before + (hasStages ? staged.StepCount() : 0);
+    run.total = parts + (hasStages ? staged.StepCount() : 0);
     error = {};
 
     // Stages alone need not make a structure that stands as a whole.
     std::vector<std::shared_ptr<IStaticResult>> results;
-    if ((before > 0 || !hasStages) && !SolveStatic(run, results, error)) return 0;
+    if ((parts > 0 || !hasStages) && !SolveStatic(run, results, error)) return 0;
     T_ANALYSIS_RESULTS found;
     if (options.modes > 0 && !FindModes(run, found.modes.emplace(), error)) return 0;
-    if (hasStages && !staged.Run(Part(options, before, run.total), found.staged, error)) return 0;
+    if (hasStages && !staged.Run(Part(options, parts, run.total), before, found.staged, error))
+        return 0;
     for (std::size_t i = 0; i < results.size(); ++i)
         found.cases[run.cases[i]] = std::move(results[i]);
     out = std::move(found);

@@ -19,8 +19,11 @@ public:
     CAnalysisRun(CDataCtrl& data, CEditData& edit) : m_data(data), m_edit(edit) {}
 
     /// Reads the model and changes nothing. One factorisation serves all load cases and the modes;
-    /// construction stages have their own. 1 done; 0 error filled, output as it was.
+    /// construction stages have their own, whose symbolic part is that of `before` (results of an
+    /// earlier run, may be null) where only loads have changed. 1 done; 0 error filled, output as
+    /// it was.
     [[nodiscard]] static int Compute(const T_MODEL& model, const T_ANALYSIS_OPTIONS& options,
+                                     const std::shared_ptr<IStagedResult>& before,
                                      T_ANALYSIS_RESULTS& out, T_ANALYSIS_ERROR& error);
     /// 1 done; 0 the modes were not changed.
     [[nodiscard]] int Keep(T_ANALYSIS_RESULTS results);

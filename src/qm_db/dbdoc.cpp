@@ -128,11 +128,12 @@ int CDBDoc::StartAnalysis(T_ANALYSIS_OPTIONS options, T_ANALYSIS_ERROR& error)
     error = {};
     m_progress = std::exchange(options.progress, {});
     m_revisionAtStart = m_data.Revision();
-    auto job = [model = m_data.Model(), options = std::move(options)](
-                   const auto& progress, T_ANALYSIS_RESULTS& out, T_ANALYSIS_ERROR& fault) {
+    auto job = [model = m_data.Model(), options = std::move(options),
+                before = m_data.StagedResult()](const auto& progress, T_ANALYSIS_RESULTS& out,
+                                                T_ANALYSIS_ERROR& fault) {
         T_ANALYSIS_OPTIONS told = options;
         told.progress = progress;
-        return CAnalysisRun::Compute(model, told, out, fault);
+        return CAnalysisRun::Compute(model, told, before, out, fault);
     };
     try {
         m_worker = std::make_shared<CAnalysisWorker>(std::move(job));

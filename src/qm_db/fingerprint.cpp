@@ -92,6 +92,19 @@ std::uint64_t FingerprintOfCase(std::uint64_t structure, const T_STLD_D& c)
     return sum.Value();
 }
 
+std::uint64_t FingerprintOfStagePlan(const T_MODEL& model)
+{
+    const T_STCT_D& control = model.styp.stageControl;
+    CSum sum;
+    sum(FingerprintOfStructure(model), model.stages, control.birth, control.geometricStiffness,
+        control.cableSag);
+    for (const int key : StageLoadCases(model)) {
+        const auto it = model.loadCases.find(key);
+        if (it != model.loadCases.end()) sum(key, it->second.group);
+    }
+    return sum.Value();
+}
+
 std::uint64_t FingerprintOfStages(const T_MODEL& model)
 {
     const T_STCT_D& control = model.styp.stageControl;

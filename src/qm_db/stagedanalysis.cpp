@@ -28,10 +28,13 @@ public:
     struct T_KEYS {
         std::vector<int> stages, cases, groups, nodes, elements; // groups: by case
     };
-    CEngineStagedResult(solver::CStagedSolver engine, T_KEYS keys, std::uint64_t fingerprint)
-        : m_engine(std::move(engine)), m_keys(std::move(keys)), m_fingerprint(fingerprint)
+    CEngineStagedResult(solver::CStagedSolver engine, T_KEYS keys, const T_MODEL& model)
+        : m_engine(std::move(engine)), m_keys(std::move(keys)),
+          m_fingerprint(FingerprintOfStages(model)), m_plan(FingerprintOfStagePlan(model))
     {
     }
+    const solver::CStagedSolver& Engine() const { return m_engine; }
+    std::uint64_t Plan() const { return m_plan; }
 
     std::uint64_t Fingerprint() const override { return m_fingerprint; }
     std::vector<T_STAGE_CASE> Cases() const override
@@ -74,7 +77,7 @@ private:
 
     solver::CStagedSolver m_engine;
     T_KEYS m_keys;
-    std::uint64_t m_fingerprint;
+    std::uint64_t m_fingerprint, m_plan;
 };
 
 } // namespace
@@ -224,15 +227,20 @@ int CStagedAnalysis::Build(T_ANALYSIS_ERROR& error)
     return 1;
 }
 
-int CStagedAnalysis::Run(const solver::ProgressFn& progress, std::shared_ptr<IStagedResult>& out,
-                         T_ANALYSIS_ERROR& error)
+int CStagedAnalysis::Run(const solver::ProgressFn& progress,
+                         const std::shared_ptr<IStagedResult>& before,
+                         std::shared_ptr<IStagedResult>& out, T_ANALYSIS_ERROR& error)
 {
     error = {};
     if (!Build(error)) return 0;
     solver::CStagedSolver engine;
     solver::T_SOLVER_ERROR fault;
-    if (!engine.Prepare(m_staged, fault) || !engine.Run(m_loads, fault, progress))
+    const auto* known = dynamic_cast<const CEngineStagedResult*>(before.get());
+    if (known && known->Plan() == FingerprintOfStagePlan(m_model))
+        engine = known->Engine().Again();
+    else if (!engine.Prepare(m_staged, fault))
         return Fail(fault, error);
+    if (!engine.Run(m_loads, fault, progress)) return Fail(fault, error);
     std::vector<int> groups;
     for (const int key : m_cases)
         groups.push_back(m_model.loadCases.at(key).group);
@@ -240,6 +248,6 @@ int CStagedAnalysis::Run(const solver::ProgressFn& progress, std::shared_ptr<ISt
         std::move(engine),
         CEngineStagedResult::T_KEYS{m_stages, m_cases, std::move(groups), m_frame.NodeIds(),
                                     m_frame.ElementIds()},
-        FingerprintOfStages(m_model));
+        m_model);
     return 1;
 }

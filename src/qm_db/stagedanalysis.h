@@ -14,9 +14,12 @@ public:
 
     /// Number of steps of all stages: what the progress counts.
     std::size_t StepCount() const;
+    /// before: results of an earlier run, may be null; where they are of the same structure and
+    /// stages its symbolic part is used again, and they stay readable.
     /// 1 done; 0 error filled: stage, and element, node or load case named; `out` as it was.
-    [[nodiscard]] int Run(const solver::ProgressFn& progress, std::shared_ptr<IStagedResult>& out,
-                          T_ANALYSIS_ERROR& error);
+    [[nodiscard]] int Run(const solver::ProgressFn& progress,
+                          const std::shared_ptr<IStagedResult>& before,
+                          std::shared_ptr<IStagedResult>& out, T_ANALYSIS_ERROR& error);
 
 private:
     int Build(T_ANALYSIS_ERROR& error);

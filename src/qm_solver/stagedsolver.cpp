@@ -6,20 +6,21 @@
 
 namespace solver {
 
-struct CStagedSolver::T_STATE {
+namespace {
+
+/// What Prepare makes; runs change the factors of the parts alone.
+struct T_PREPARED {
     T_STAGED_MODEL model;
     T_STAGE_PLAN plan;
     std::vector<std::unique_ptr<CStagePart>> parts; // those that differ
     std::vector<std::size_t> partOf;                // by stage
-    T_STAGED_COST cost;
-    std::optional<CStagedRun> run;
 
-    explicit T_STATE(const T_STAGED_MODEL& staged) : model(staged) {}
-    std::optional<T_SOLVER_ERROR> MakeParts();
+    explicit T_PREPARED(const T_STAGED_MODEL& staged) : model(staged) {}
+    std::optional<T_SOLVER_ERROR> MakeParts(T_STAGED_COST& cost);
 };
 
 /// All parts share the memory of one factor.
-std::optional<T_SOLVER_ERROR> CStagedSolver::T_STATE::MakeParts()
+std::optional<T_SOLVER_ERROR> T_PREPARED::MakeParts(T_STAGED_COST& cost)
 {
     const auto space = std::make_shared<CFactorSpace>();
     for (std::size_t s = 0; s < plan.active.size(); ++s) {
@@ -38,6 +39,14 @@ std::optional<T_SOLVER_ERROR> CStagedSolver::T_STATE::MakeParts()
     return {};
 }
 
+} // namespace
+
+struct CStagedSolver::T_STATE {
+    std::shared_ptr<T_PREPARED> prepared;
+    T_STAGED_COST cost;
+    std::optional<CStagedRun> run;
+};
+
 CStagedSolver::CStagedSolver() = default;
 CStagedSolver::~CStagedSolver() = default;
 CStagedSolver::CStagedSolver(CStagedSolver&&) noexcept = default;
@@ -46,9 +55,11 @@ CStagedSolver& CStagedSolver::operator=(CStagedSolver&&) noexcept = default;
 int CStagedSolver::Prepare(const T_STAGED_MODEL& model, T_SOLVER_ERROR& error)
 {
     m_state.reset();
-    auto state = std::make_unique<T_STATE>(model);
-    std::optional<T_SOLVER_ERROR> fault = MakePlan(state->model, state->plan);
-    if (!fault) fault = state->MakeParts();
+    auto state = std::make_unique<T_STATE>();
+    state->prepared = std::make_shared<T_PREPARED>(model);
+    T_PREPARED& prepared = *state->prepared;
+    std::optional<T_SOLVER_ERROR> fault = MakePlan(prepared.model, prepared.plan);
+    if (!fault) fault = prepared.MakeParts(state->cost);
     if (fault) {
         error = *fault;
         return 0;
@@ -57,20 +68,29 @@ int CStagedSolver::Prepare(const T_STAGED_MODEL& model, T_SOLVER_ERROR& error)
     return 1;
 }
 
+CStagedSolver CStagedSolver::Again() const
+{
+    CStagedSolver other;
+    if (!m_state) return other;
+    other.m_state = std::make_unique<T_STATE>();
+    other.m_state->prepared = m_state->prepared;
+    return other;
+}
+
 int CStagedSolver::Run(std::span<const T_LOAD_CASE> cases, T_SOLVER_ERROR& error,
                        const ProgressFn& progress)
 {
     std::optional<T_SOLVER_ERROR> fault;
     if (m_state) m_state->run.reset();
-    if (!m_state || cases.size() != m_state->model.groups.size()) {
+    if (!m_state || cases.size() != m_state->prepared->model.groups.size()) {
         fault.emplace();
         fault->fault = m_state ? SOLVER_FAULT::BadModel : SOLVER_FAULT::Failed;
         fault->reason = m_state ? "not every load case has its group" : "no model is prepared";
     } else {
-        T_STATE& s = *m_state;
-        s.run.emplace(s.model, s.plan, s.parts, s.partOf, cases, s.cost);
-        fault = s.run->Go(progress);
-        if (fault) s.run.reset();
+        T_PREPARED& p = *m_state->prepared;
+        m_state->run.emplace(p.model, p.plan, p.parts, p.partOf, cases, m_state->cost);
+        fault = m_state->run->Go(progress);
+        if (fault) m_state->run.reset();
     }
     if (fault) {
         error = *fault;
@@ -81,23 +101,24 @@ int CStagedSolver::Run(std::span<const T_LOAD_CASE> cases, T_SOLVER_ERROR& error
 
 std::size_t CStagedSolver::StageCount() const
 {
-    return m_state ? m_state->model.stages.size() : 0;
+    return m_state ? m_state->prepared->model.stages.size() : 0;
 }
 
 int CStagedSolver::StepCount(std::size_t stage) const
 {
-    return stage < StageCount() ? m_state->model.stages[stage].steps : 0;
+    return stage < StageCount() ? m_state->prepared->model.stages[stage].steps : 0;
 }
 
 double CStagedSolver::Age(std::size_t element, std::size_t stage) const
 {
     constexpr double kAway = -1.0;
-    if (stage >= StageCount() || element >= m_state->plan.bornIn.size()) return kAway;
-    const auto& there = m_state->plan.active[stage].elements;
+    if (stage >= StageCount() || element >= m_state->prepared->plan.bornIn.size()) return kAway;
+    const auto& there = m_state->prepared->plan.active[stage].elements;
     if (!std::binary_search(there.begin(), there.end(), element)) return kAway;
     double age = 0.0;
-    for (auto s = static_cast<std::size_t>(m_state->plan.bornIn[element]); s <= stage; ++s)
-        age += m_state->model.stages[s].duration;
+    for (auto s = static_cast<std::size_t>(m_state->prepared->plan.bornIn[element]); s <= stage;
+         ++s)
+        age += m_state->prepared->model.stages[s].duration;
     return age;
 }
 
@@ -111,7 +132,8 @@ int CStagedSolver::Read(std::size_t stage, int step, std::span<const double> fac
                         T_RESULT& out) const
 {
     out = {};
-    if (!m_state || !m_state->run || factors.size() != m_state->model.groups.size()) return 0;
+    if (!m_state || !m_state->run || factors.size() != m_state->prepared->model.groups.size())
+        return 0;
     T_MIX mix;
     for (std::size_t c = 0; c < factors.size(); ++c)
         if (factors[c] != 0.0) mix.emplace_back(c, factors[c]);
@@ -121,8 +143,8 @@ int CStagedSolver::Read(std::size_t stage, int step, std::span<const double> fac
 int CStagedSolver::ReadCase(std::size_t stage, int step, std::size_t loadCase, T_RESULT& out) const
 {
     out = {};
-    if (!m_state || loadCase >= m_state->model.groups.size()) return 0;
-    std::vector<double> factors(m_state->model.groups.size(), 0.0);
+    if (!m_state || loadCase >= m_state->prepared->model.groups.size()) return 0;
+    std::vector<double> factors(m_state->prepared->model.groups.size(), 0.0);
     factors[loadCase] = 1.0;
     return Read(stage, step, factors, out);
 }
@@ -132,7 +154,7 @@ int CStagedSolver::ReadSum(std::size_t stage, int step, STAGE_SUM sum, T_RESULT&
     out = {};
     if (!m_state) return 0;
     std::vector<double> factors;
-    for (const LOAD_GROUP group : m_state->model.groups)
+    for (const LOAD_GROUP group : m_state->prepared->model.groups)
         factors.push_back(
             sum == STAGE_SUM::All || static_cast<int>(sum) == static_cast<int>(group) ? 1.0 : 0.0);
     return Read(stage, step, factors, out);

@@ -50,6 +50,11 @@ public:
     /// (with the stage) and the solver holds no model.
     [[nodiscard]] int Prepare(const T_STAGED_MODEL& model, T_SOLVER_ERROR& error);
 
+    /// Another solver of the same prepared model, without results, that repeats no symbolic part.
+    /// Both share their factors: only one of them may run at a time, while results of the other can
+    /// be read. Without a prepared model it has none either.
+    [[nodiscard]] CStagedSolver Again() const;
+
     /// Runs all stages with these load cases; again with others as often as wanted, which repeats
     /// no symbolic part. Progress counts steps. 1 done; 0 error filled (stage, load case), no
     /// results.

@@ -76,6 +76,41 @@ TEST(StagedAnalysis, GivesTheHandCalculatedBeamByStageStepAndLoad)
             << row.stage << ' ' << row.step << ' ' << row.load << ' ' << row.node;
 }
 
+/// The engine's preparation is used again; what it was prepared for must still be told apart.
+TEST(StagedAnalysis, AnotherRunTakesChangedLoadsAndChangedStages)
+{
+    CDBDoc doc;
+    doc.Data().Assign(Grown());
+    T_ANALYSIS_ERROR error;
+    ASSERT_EQ(1, doc.RunAnalysis(StagesOnly(), error)) << error.text;
+    const std::shared_ptr<IStagedResult> first = doc.Data().StagedResult();
+    T_STLD_D load;
+    T_STAG_D stage;
+    ASSERT_EQ(1, doc.Edit().Begin("loads"));
+    ASSERT_EQ(1, doc.Attr().GetStld(1, load));
+    load.nodal[0].load[2] *= 3.0;
+    ASSERT_EQ(1, doc.Edit().Put(1, load));
+    ASSERT_EQ(1, doc.Edit().Commit());
+    ASSERT_EQ(1, doc.RunAnalysis(StagesOnly(), error)) << error.text;
+    EXPECT_NEAR(3 * kDownG, Down(doc, 1, 1, kStageLoadSum, 2), 1e-12);
+    std::vector<std::shared_ptr<IStaticResult>> kept;
+    ASSERT_EQ(1, first->Open({1, 1, 1}, kept)); // those before stay as they were
+    T_DOF6 u{};
+    ASSERT_EQ(1, kept.at(0)->ReadDisplacement(2, u));
+    EXPECT_NEAR(-kDownG, u[2], 1e-12);
+
+    ASSERT_EQ(1, doc.Edit().Begin("stages"));
+    ASSERT_EQ(1, doc.Attr().GetStag(2, stage));
+    stage.activate.loads.clear(); // E does not come any more
+    ASSERT_EQ(1, doc.Edit().Put(2, stage));
+    ASSERT_EQ(1, doc.Attr().GetStag(5, stage));
+    stage.deactivate.loads.clear();
+    ASSERT_EQ(1, doc.Edit().Put(5, stage));
+    ASSERT_EQ(1, doc.Edit().Commit());
+    ASSERT_EQ(1, doc.RunAnalysis(StagesOnly(), error)) << error.text;
+    EXPECT_NEAR(3 * kDownG, Down(doc, 2, 3, kStageLoadSum, 2), 1e-12);
+}
+
 TEST(StagedAnalysis, GivesReactionsAndForcesInCurrentUnits)
 {
     CDBDoc doc;

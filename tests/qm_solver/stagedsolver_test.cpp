@@ -469,6 +469,14 @@ TEST(StagedSolver, RunsAgainWithoutAnotherAnalysis)
     ASSERT_TRUE(staged.Run(std::vector<T_LOAD_CASE>{twice}, error)) << error.reason;
     EXPECT_EQ(kSegments, staged.Cost().analyses);
     ExpectSame(Sum(once, once), Case(staged, kSegments, 0), 1e-12);
+
+    CStagedSolver other = staged.Again();
+    T_RESULT none;
+    EXPECT_FALSE(other.ReadCase(kSegments, kLastStep, 0, none));
+    ASSERT_TRUE(other.Run(std::vector<T_LOAD_CASE>{Weight()}, error)) << error.reason;
+    EXPECT_EQ(0U, other.Cost().analyses);
+    ExpectSame(once, Case(other, kSegments, 0), 1e-12);
+    ExpectSame(Sum(once, once), Case(staged, kSegments, 0), 1e-12); // stays
 }
 
 TEST(StagedSolver, StopsWhenItIsCancelled)
