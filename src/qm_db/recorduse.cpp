@@ -30,10 +30,10 @@ constexpr int kStaticPattern = 0; // kind of a pushover pattern that names a sta
 
 // By RECORD_KIND.
 constexpr std::array<const char*, 14> kKindKeys{
-    "IDS_QM_DB_USER_ELEMENT",       "IDS_QM_DB_USER_DIAPHRAGM",      "IDS_QM_DB_USER_EQUAL",
-    "IDS_QM_DB_USER_LOAD_CASE",     "IDS_QM_DB_USER_LCOM",           "IDS_QM_DB_USER_ULF_ITEM",
-    "IDS_QM_DB_USER_STOREY",        "IDS_QM_DB_USER_HINGE",          "IDS_QM_DB_USER_HINGE_TYPE",
-    "IDS_QM_DB_USER_PUSHOVER",      "IDS_QM_DB_USER_ULF_CONSTRAINT", "IDS_QM_DB_USER_STAGE",
+    "IDS_QM_DB_USER_ELEMENT",        "IDS_QM_DB_USER_DIAPHRAGM",      "IDS_QM_DB_USER_EQUAL",
+    "IDS_QM_DB_USER_LOAD_CASE",      "IDS_QM_DB_USER_LCOM",           "IDS_QM_DB_USER_ULF_ITEM",
+    "IDS_QM_DB_USER_STOREY",         "IDS_QM_DB_USER_HINGE",          "IDS_QM_DB_USER_HINGE_TYPE",
+    "IDS_QM_DB_USER_PUSHOVER",       "IDS_QM_DB_USER_ULF_CONSTRAINT", "IDS_QM_DB_USER_STAGE",
     "IDS_QM_DB_USER_ULF_STAGE_ITEM", "IDS_QM_DB_USER_EVALUATION"};
 
 /// Adds the stages of which a part, what comes or what goes, fulfils `uses`.
@@ -180,10 +180,9 @@ template <>
 T_RECORD_USERS UsersOf<T_SPFC_D>(const T_MODEL& model, int key)
 {
     T_RECORD_USERS users;
-    Collect(model.evaluations, RECORD_KIND::Evaluation, users,
-            [name = NameOfKey(model.spectra, key)](const T_EVAL_D& e) {
-                return e.spectrum == name;
-            });
+    Collect(
+        model.evaluations, RECORD_KIND::Evaluation, users,
+        [name = NameOfKey(model.spectra, key)](const T_EVAL_D& e) { return e.spectrum == name; });
     return users;
 }
 
@@ -192,9 +191,7 @@ T_RECORD_USERS UsersOf<T_POLC_D>(const T_MODEL& model, int key)
 {
     T_RECORD_USERS users;
     Collect(model.evaluations, RECORD_KIND::Evaluation, users,
-            [name = NameOfKey(model.pushovers, key)](const T_EVAL_D& e) {
-                return e.push == name;
-            });
+            [name = NameOfKey(model.pushovers, key)](const T_EVAL_D& e) { return e.push == name; });
     return users;
 }
 
