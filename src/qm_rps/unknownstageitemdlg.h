@@ -19,7 +19,7 @@ public:
                                                            "IDS_QM_ULSI_OWN"};
     /// A row below the grid: how many loads read the dead load, the erection load, and in all.
     struct T_SUMMARY {
-        const char* key = nullptr; // of its text
+        std::string_view key; // of its text
         std::size_t rows = 0, unknowns = 0;
         bool operator==(const T_SUMMARY&) const = default;
     };
