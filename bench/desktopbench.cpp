@@ -3,9 +3,9 @@
 #include "benchapp.h"
 #include "pushovertools.h"
 #include "qm_rps/pushovercurveedit.h"
-#include "qm_ui/dialogwindow.h"
-#include "qm_ui/plotwidget.h"
-#include "qm_ui/pushovercurveplot.h"
+#include "qm_ui/form/dialogwindow.h"
+#include "qm_ui/plot/plotwidget.h"
+#include "qm_ui/pushover/pushovercurveplot.h"
 #include "ratios.h"
 
 #include <QApplication>

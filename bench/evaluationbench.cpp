@@ -1,8 +1,8 @@
 // Cost of the evaluation kernels. Every benchmark checks its answer: a fast wrong path fails.
+#include "qm_rps/pushover/pushovertargetevaluation.h"
 #include "qm_rps/pushovercalcperfptfema440proca.h"
 #include "qm_rps/pushovercalcperfptfema440procc.h"
 #include "qm_rps/pushovercalcperfptproca.h"
-#include "qm_rps/pushovertargetevaluation.h"
 #include "ratios.h"
 
 #include <benchmark/benchmark.h>

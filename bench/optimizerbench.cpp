@@ -1,6 +1,6 @@
 // Unknown load factors against the linear programming library alone on the same scaled rows.
-#include "qm_db/ulffallback.h"
-#include "qm_db/ulfsolver.h"
+#include "qm_solver/factors/ulffallback.h"
+#include "qm_solver/ulfsolver.h"
 #include "ratios.h"
 #include "ulfplanted.h"
 

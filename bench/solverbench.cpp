@@ -1,9 +1,9 @@
 // Cost of the analysis engine on a frame of about 100,000 unknowns, against its own factorisation
 // and against the sparse library called directly.
-#include "qm_solver/caseblock.h"
-#include "qm_solver/frameassembly.h"
+#include "qm_solver/checks/mechanism.h"
+#include "qm_solver/frame/caseblock.h"
+#include "qm_solver/frame/frameassembly.h"
 #include "qm_solver/framesolver.h"
-#include "qm_solver/mechanism.h"
 #include "ratios.h"
 
 #include <benchmark/benchmark.h>

@@ -1,7 +1,7 @@
 // Cost of 20 construction stages of up to 20,280 unknowns, against the factorisations of their
 // active parts alone.
 #include "qm_solver/stagedsolver.h"
-#include "qm_solver/stagepart.h"
+#include "qm_solver/stages/stagepart.h"
 #include "ratios.h"
 
 #include <benchmark/benchmark.h>

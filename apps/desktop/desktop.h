@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_rps/mainframe.h"
-#include "qm_ui/dialogview.h"
+#include "qm_ui/form/dialogview.h"
 
 #include <string>
 

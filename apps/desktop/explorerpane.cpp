@@ -1,7 +1,7 @@
 #include "explorerpane.h"
 
 #include "qm_base/msgfunction.h"
-#include "qm_ui/gridview.h"
+#include "qm_ui/form/gridview.h"
 
 #include <QHBoxLayout>
 #include <QHeaderView>

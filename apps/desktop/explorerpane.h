@@ -1,7 +1,7 @@
 // The model explorer: the list of tables with their counts, and the table that is chosen.
 #pragma once
 
-#include "qm_rps/recordgrid.h"
+#include "qm_rps/desk/recordgrid.h"
 
 #include <QWidget>
 

@@ -2,7 +2,7 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
-#include "qm_ui/localnumber.h"
+#include "qm_ui/form/localnumber.h"
 
 #include <QComboBox>
 #include <QHBoxLayout>

@@ -1,8 +1,8 @@
 // The frame view with its controls: what it is shown under, the step, the scale, what is drawn.
 #pragma once
 
-#include "qm_ui/frameview.h"
-#include "qm_ui/picturefile.h"
+#include "qm_ui/frame/frameview.h"
+#include "qm_ui/report/picturefile.h"
 
 #include <QWidget>
 

@@ -1,7 +1,7 @@
 #include "hingetools.h"
 
-#include "qm_rps/hingedocument.h"
-#include "qm_ui/hingeviews.h"
+#include "qm_rps/hinge/hingedocument.h"
+#include "qm_ui/hinge/hingeviews.h"
 
 namespace {
 

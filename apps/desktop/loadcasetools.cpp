@@ -12,9 +12,9 @@
 #include "qm_rps/po_loadcaselistdlg.h"
 #include "qm_rps/po_selectloadcasedlg.h"
 #include "qm_rps/rps_main.h"
-#include "qm_ui/dialogwindow.h"
-#include "qm_ui/figureview.h"
-#include "qm_ui/loadcaseview.h"
+#include "qm_ui/form/dialogwindow.h"
+#include "qm_ui/hinge/figureview.h"
+#include "qm_ui/loadcase/loadcaseview.h"
 
 #include <QEvent>
 #include <QTabWidget>

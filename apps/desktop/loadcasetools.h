@@ -5,7 +5,7 @@
 #include "desktop.h"
 #include "windowpictures.h"
 
-#include "qm_rps/recordgrid.h"
+#include "qm_rps/desk/recordgrid.h"
 
 void RegisterLoadCaseViews(CViewFactory& factory);
 /// Commands in the order of the menus. The desktop must outlive them.

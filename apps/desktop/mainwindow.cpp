@@ -5,7 +5,7 @@
 
 #include "qm_base/messagehistory.h"
 #include "qm_base/msgfunction.h"
-#include "qm_ui/printing.h"
+#include "qm_ui/report/printing.h"
 
 #include <QAction>
 #include <QApplication>

@@ -7,7 +7,7 @@
 #include "qm_rps/pushovercomparisondlg.h"
 #include "qm_rps/pushovercurvedampparamuser.h"
 #include "qm_rps/pushovertextdlg.h"
-#include "qm_ui/pushovercurveview.h"
+#include "qm_ui/pushover/pushovercurveview.h"
 
 namespace {
 

@@ -4,7 +4,7 @@
 #include "desktop.h"
 
 #include "qm_rps/pushovercurveedit.h"
-#include "qm_ui/dialogwindow.h"
+#include "qm_ui/form/dialogwindow.h"
 
 /// Follows the document: what changes there is evaluated again while the window is open.
 class CPushOverWindow : public CDialogWindow {

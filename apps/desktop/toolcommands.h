@@ -4,7 +4,7 @@
 #include "command.h"
 #include "desktop.h"
 
-#include "qm_rps/recordgrid.h"
+#include "qm_rps/desk/recordgrid.h"
 
 /// The views of every dialog model.
 void RegisterViews(CViewFactory& factory);

@@ -8,11 +8,11 @@
 #include "qm_rps/unknownloadfactoriteranaldlg.h"
 #include "qm_rps/unknownstageitemdlg.h"
 #include "qm_rps/unknowntabletabgrid1.h"
-#include "qm_ui/loadcombinationview.h"
-#include "qm_ui/ulfconstraintview.h"
-#include "qm_ui/ulfitemview.h"
-#include "qm_ui/ulfiterationview.h"
-#include "qm_ui/ulfresultview.h"
+#include "qm_ui/factors/ulfconstraintview.h"
+#include "qm_ui/factors/ulfitemview.h"
+#include "qm_ui/factors/ulfiterationview.h"
+#include "qm_ui/factors/ulfresultview.h"
+#include "qm_ui/loadcase/loadcombinationview.h"
 
 void RegisterUlfViews(CViewFactory& factory)
 {

@@ -1,9 +1,9 @@
 #include "qm_db/analysisrun.h"
 
 #include "qm_base/msgfunction.h"
-#include "qm_db/analysismodel.h"
-#include "qm_db/fingerprint.h"
-#include "qm_db/stagedanalysis.h"
+#include "qm_db/analysis/analysismodel.h"
+#include "qm_db/analysis/stagedanalysis.h"
+#include "qm_db/results/fingerprint.h"
 
 #include <algorithm>
 #include <span>

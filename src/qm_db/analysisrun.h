@@ -1,7 +1,7 @@
 // Linear static analysis of load cases, eigen analysis and construction stages of a model.
 #pragma once
 
-#include "qm_db/analysisoptions.h"
+#include "qm_db/analysis/analysisoptions.h"
 #include "qm_db/editdata.h"
 
 /// What an analysis has found.

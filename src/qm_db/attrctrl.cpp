@@ -1,7 +1,7 @@
 #include "qm_db/attrctrl.h"
 
-#include "qm_db/lcomflatten.h"
-#include "qm_db/recordunits.h"
+#include "qm_db/records/lcomflatten.h"
+#include "qm_db/records/recordunits.h"
 
 #include <set>
 #include <utility>

@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_db/datactrl.h"
-#include "qm_db/hingetype.h"
+#include "qm_db/records/hingetype.h"
 
 #include <string>
 #include <string_view>

@@ -1,7 +1,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_db/attrctrl.h"
-#include "qm_db/recordunits.h"
+#include "qm_db/records/recordunits.h"
 
 // Records of construction stages; they hold no quantities.
 

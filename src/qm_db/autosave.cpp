@@ -1,8 +1,8 @@
 #include "qm_db/autosave.h"
 
 #include "qm_db/dbdoc.h"
-#include "qm_db/modellock.h"
-#include "qm_db/storefault.h"
+#include "qm_db/file/storefault.h"
+#include "qm_db/store/modellock.h"
 
 #include <algorithm>
 #include <charconv>

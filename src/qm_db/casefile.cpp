@@ -1,9 +1,9 @@
 #include "qm_db/casefile.h"
 
-#include "qm_db/casereader.h"
-#include "qm_db/casewriter.h"
+#include "qm_db/casefile/casereader.h"
+#include "qm_db/casefile/casewriter.h"
+#include "qm_db/casefile/jsonparser.h"
 #include "qm_db/filectrl.h"
-#include "qm_db/jsonparser.h"
 
 #include <filesystem>
 

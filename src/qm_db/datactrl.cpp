@@ -1,7 +1,7 @@
 #include "qm_db/datactrl.h"
 
 #include "qm_db/editdata.h"
-#include "qm_db/lcomflatten.h"
+#include "qm_db/records/lcomflatten.h"
 
 #include <algorithm>
 #include <utility>

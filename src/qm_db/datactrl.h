@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_db/modelstore.h"
-#include "qm_db/stagedresult.h"
+#include "qm_db/results/stagedresult.h"
 
 /// Where the model keeps the table of a record type.
 template <class T>

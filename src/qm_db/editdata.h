@@ -2,9 +2,9 @@
 #pragma once
 
 #include "qm_db/attrctrl.h"
-#include "qm_db/recordfit.h"
-#include "qm_db/recordunits.h"
-#include "qm_db/recorduse.h"
+#include "qm_db/records/recordfit.h"
+#include "qm_db/records/recordunits.h"
+#include "qm_db/records/recorduse.h"
 #include "qm_db/undoctrl.h"
 
 class CEditData {

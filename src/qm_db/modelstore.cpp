@@ -1,9 +1,9 @@
 #include "qm_db/modelstore.h"
 
-#include "qm_db/modellock.h"
-#include "qm_db/modelreader.h"
-#include "qm_db/modeltemp.h"
-#include "qm_db/storefault.h"
+#include "qm_db/file/storefault.h"
+#include "qm_db/store/modellock.h"
+#include "qm_db/store/modelreader.h"
+#include "qm_db/store/modeltemp.h"
 
 #include <cerrno>
 #include <filesystem>

@@ -4,9 +4,9 @@
 #pragma once
 
 #include "qm_db/fileerror.h"
-#include "qm_db/pushresult.h"
 #include "qm_db/records.h"
-#include "qm_db/stagedresult.h"
+#include "qm_db/results/pushresult.h"
+#include "qm_db/results/stagedresult.h"
 
 #include <memory>
 #include <string>

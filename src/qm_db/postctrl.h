@@ -1,8 +1,8 @@
 // Reading results: eigen modes and pushover steps, in the document's current units.
 #pragma once
 
-#include "qm_db/stagedreader.h"
-#include "qm_db/staticreader.h"
+#include "qm_db/results/stagedreader.h"
+#include "qm_db/results/staticreader.h"
 
 #include <map>
 #include <string>

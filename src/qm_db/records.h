@@ -1,10 +1,10 @@
 // Records of the model database. Plain data; in the store every quantity is in SI.
 #pragma once
 
-#include "qm_db/hingerecords.h"
-#include "qm_db/loadrecords.h"
-#include "qm_db/stagerecords.h"
-#include "qm_db/units.h"
+#include "qm_db/records/hingerecords.h"
+#include "qm_db/records/loadrecords.h"
+#include "qm_db/records/stagerecords.h"
+#include "qm_db/records/units.h"
 
 #include <array>
 #include <map>

@@ -1,7 +1,7 @@
 #include "qm_db/rps_unknownloadfactormanager.h"
 
-#include "qm_db/ulfexact.h"
-#include "qm_db/ulfsolver.h"
+#include "qm_solver/ulfexact.h"
+#include "qm_solver/ulfsolver.h"
 
 #include <algorithm>
 #include <exception>

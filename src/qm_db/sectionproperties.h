@@ -1,7 +1,7 @@
 // Properties of rectangle, circle, pipe, box and I from their dimensions (sharp corners).
 #pragma once
 
-#include "qm_db/structrecords.h"
+#include "qm_db/records/structrecords.h"
 
 #include <vector>
 

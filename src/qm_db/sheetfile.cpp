@@ -2,8 +2,8 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/neutrallocale.h"
+#include "qm_db/file/storefault.h"
 #include "qm_db/filectrl.h"
-#include "qm_db/storefault.h"
 
 #include <algorithm>
 #include <cerrno>

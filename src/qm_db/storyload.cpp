@@ -1,6 +1,6 @@
 #include "qm_db/storyload.h"
 
-#include "qm_db/recordunits.h"
+#include "qm_db/records/recordunits.h"
 
 #include <algorithm>
 #include <set>

@@ -1,7 +1,7 @@
 // Grid of the interaction points of one curve of an inelastic hinge property.
 #pragma once
 
-#include "qm_rps/pmpointgrid.h"
+#include "qm_rps/dialog/pmpointgrid.h"
 
 /// Ten rows, columns P/Pmax and M/MY,max, with 15 digits. The curve is not owned.
 class CIehpYieldPropGrid2 : public CPmPointGrid {

@@ -1,6 +1,6 @@
 #include "qm_rps/modelessdlgctrl.h"
 
-#include "qm_rps/docmodule.h"
+#include "qm_rps/desk/docmodule.h"
 
 CModelessDlgCtrl& CModelessDlgCtrl::Of(CDBDoc& doc)
 {

@@ -4,7 +4,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/testenvmgr.h"
 #include "qm_db/rps_unknownloadfactormanager.h"
-#include "qm_rps/optdump.h"
+#include "qm_rps/factors/optdump.h"
 
 #include <algorithm>
 #include <cmath>

@@ -2,7 +2,7 @@
 // hold, either as a square system of equations or as the minimum of an objective.
 #pragma once
 
-#include "qm_rps/optrows.h"
+#include "qm_rps/factors/optrows.h"
 
 #include <functional>
 #include <string>

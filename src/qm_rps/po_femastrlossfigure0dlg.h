@@ -1,7 +1,7 @@
 // Figure of the strength loss without cyclic degradation: it follows the backbone.
 #pragma once
 
-#include "qm_rps/femafigure.h"
+#include "qm_rps/hinge/femafigure.h"
 
 class CPO_FEMAStrLossFigure0Dlg : public CFemaFigureDlg {
 public:

@@ -1,7 +1,7 @@
 // Figure of the strength loss with cyclic degradation: it also falls with dissipated energy.
 #pragma once
 
-#include "qm_rps/femafigure.h"
+#include "qm_rps/hinge/femafigure.h"
 
 class CPO_FEMAStrLossFigureEDlg : public CFemaFigureDlg {
 public:

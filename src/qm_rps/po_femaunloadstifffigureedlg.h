@@ -2,7 +2,7 @@
 // does to a loop of given area.
 #pragma once
 
-#include "qm_rps/femafigure.h"
+#include "qm_rps/hinge/femafigure.h"
 
 class CPO_FEMAUnloadStiffFigureEDlg : public CFemaFigureDlg {
 public:

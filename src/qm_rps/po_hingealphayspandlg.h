@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_rps/hingelabels.h"
+#include "qm_rps/hinge/hingelabels.h"
 
 class CPO_HingeAlphaYSpanDlg : public zql::frx::MDialog {
 public:

@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_rps/hingesiderules.h"
+#include "qm_rps/hinge/hingesiderules.h"
 
 class CPO_HingeFEMAEnrgDsptGrid : public zql::frx::MDialog {
 public:

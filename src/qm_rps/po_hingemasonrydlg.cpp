@@ -1,6 +1,6 @@
 #include "qm_rps/po_hingemasonrydlg.h"
 
-#include "qm_rps/hingesiderules.h"
+#include "qm_rps/hinge/hingesiderules.h"
 
 namespace {
 

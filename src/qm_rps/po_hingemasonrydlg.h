@@ -2,8 +2,8 @@
 // coefficient. Strengths are stresses, in the caller's units.
 #pragma once
 
-#include "qm_rps/hingedialog.h"
-#include "qm_rps/hingelabels.h"
+#include "qm_rps/dialog/hingedialog.h"
+#include "qm_rps/hinge/hingelabels.h"
 
 class CPO_HingeMasonryDlg : public CHingeDialog {
 public:

@@ -1,6 +1,6 @@
 #include "qm_rps/po_hingeskcvtabdlg.h"
 
-#include "qm_rps/hingemirror.h"
+#include "qm_rps/hinge/hingemirror.h"
 
 #include "qm_db/compfunc.h"
 

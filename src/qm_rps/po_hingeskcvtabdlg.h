@@ -2,8 +2,8 @@
 // Both sides hold magnitudes; units as the caller's.
 #pragma once
 
-#include "qm_rps/hingedialog.h"
-#include "qm_rps/hingelabels.h"
+#include "qm_rps/dialog/hingedialog.h"
+#include "qm_rps/hinge/hingelabels.h"
 
 class CPO_HingeSkcvTabDlg : public CHingeDialog {
 public:

@@ -1,8 +1,8 @@
 #include "qm_rps/po_hingeskcvtabeurodlg.h"
 
-#include "qm_rps/hingemeasure.h"
-#include "qm_rps/hingemirror.h"
-#include "qm_rps/hingesiderules.h"
+#include "qm_rps/hinge/hingemeasure.h"
+#include "qm_rps/hinge/hingemirror.h"
+#include "qm_rps/hinge/hingesiderules.h"
 
 namespace {
 

@@ -2,8 +2,8 @@
 // as acceptance criteria). Points follow the FEMA pattern; signs and units as there.
 #pragma once
 
-#include "qm_rps/hingedialog.h"
-#include "qm_rps/hingelabels.h"
+#include "qm_rps/dialog/hingedialog.h"
+#include "qm_rps/hinge/hingelabels.h"
 
 #include <array>
 #include <optional>

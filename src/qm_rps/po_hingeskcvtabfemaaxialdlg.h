@@ -4,7 +4,7 @@
 // edited or added (value table); the caller's rows stay as they are.
 #pragma once
 
-#include "qm_rps/hingefindings.h"
+#include "qm_rps/hinge/hingefindings.h"
 #include "qm_rps/po_hingeskcvtabfemaaxialgrid.h"
 
 #include <map>

@@ -2,9 +2,9 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
-#include "qm_rps/hingemeasure.h"
-#include "qm_rps/hingemirror.h"
-#include "qm_rps/hingesiderules.h"
+#include "qm_rps/hinge/hingemeasure.h"
+#include "qm_rps/hinge/hingemirror.h"
+#include "qm_rps/hinge/hingesiderules.h"
 #include "qm_rps/po_hingefemaenrgdsptgrid.h"
 #include "qm_rps/po_hingeskcvtabfemaaxialgrid.h"
 

@@ -6,8 +6,8 @@
 // all that it has. Nothing leaves the editor before CheckData passes.
 #pragma once
 
-#include "qm_rps/hingedialog.h"
-#include "qm_rps/hingelabels.h"
+#include "qm_rps/dialog/hingedialog.h"
+#include "qm_rps/hinge/hingelabels.h"
 
 #include <array>
 #include <optional>

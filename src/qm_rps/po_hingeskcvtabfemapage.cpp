@@ -1,6 +1,6 @@
 // What a page of the editor of FEMA curves shows.
 #include "qm_base/textformat.h"
-#include "qm_rps/hingemirror.h"
+#include "qm_rps/hinge/hingemirror.h"
 #include "qm_rps/po_hingeskcvtabfemadlg.h"
 
 #include <algorithm>

@@ -1,6 +1,6 @@
 // What the hinge type editor offers: lists, states of its parts, labels.
 #include "qm_base/textformat.h"
-#include "qm_rps/hingetheta.h"
+#include "qm_rps/hinge/hingetheta.h"
 #include "qm_rps/po_hingeskcvtabeurodlg.h"
 #include "qm_rps/po_hingetypedlg.h"
 #include "qm_rps/po_hingetypelistdlg.h"

@@ -1,6 +1,6 @@
 #include "qm_rps/po_hingetypedlg.h"
 
-#include "qm_rps/hingetypefindings.h"
+#include "qm_rps/hinge/hingetypefindings.h"
 #include "qm_rps/po_hingealphayspandlg.h"
 #include "qm_rps/po_hingeintegrationpointdlg.h"
 #include "qm_rps/po_hingelengthmphidlg.h"

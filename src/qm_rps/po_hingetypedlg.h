@@ -3,9 +3,9 @@
 // stored.
 #pragma once
 
-#include "qm_rps/hingecontext.h"
-#include "qm_rps/hingedialog.h"
-#include "qm_rps/hingelabels.h"
+#include "qm_rps/dialog/hingedialog.h"
+#include "qm_rps/hinge/hingecontext.h"
+#include "qm_rps/hinge/hingelabels.h"
 
 #include <functional>
 

@@ -2,9 +2,8 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_db/hingerecords.h"
 #include "qm_db/records.h"
-#include "qm_rps/hingecontext.h"
+#include "qm_rps/hinge/hingecontext.h"
 
 #include <functional>
 #include <optional>

@@ -1,6 +1,6 @@
 // What the hinge type editor previews, and its findings.
 #include "qm_base/msgfunction.h"
-#include "qm_rps/hingetypefindings.h"
+#include "qm_rps/hinge/hingetypefindings.h"
 #include "qm_rps/po_hingetypedlg.h"
 #include "qm_rps/pushoverhingelistdlg.h"
 

@@ -1,6 +1,6 @@
 #include "qm_rps/po_hingeyieldpropdlgnew.h"
 
-#include "qm_rps/hingesiderules.h"
+#include "qm_rps/hinge/hingesiderules.h"
 #include "qm_rps/po_hingeyieldpropgrid.h"
 
 #include <algorithm>

@@ -1,9 +1,9 @@
 // Model of the editor of a hinge type's yield surface.
 #pragma once
 
-#include "qm_db/hingerecords.h"
-#include "qm_rps/hingedialog.h"
-#include "qm_rps/hingelabels.h"
+#include "qm_db/records.h"
+#include "qm_rps/dialog/hingedialog.h"
+#include "qm_rps/hinge/hingelabels.h"
 
 class CPO_HingeYieldPropDlgNew : public CHingeDialog {
 public:

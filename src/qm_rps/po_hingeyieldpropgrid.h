@@ -1,8 +1,8 @@
 // Grid of the interaction points of one axis of a yield level, both sides.
 #pragma once
 
-#include "qm_db/hingerecords.h"
-#include "qm_rps/hingenumbergrid.h"
+#include "qm_db/records.h"
+#include "qm_rps/dialog/hingenumbergrid.h"
 
 /// Names of the ten points, compression side first.
 inline constexpr std::array<const char*, 10> kPmPointNames{"E(c)", "D(c)", "C(c)", "B(c)", "A(c)",

@@ -2,7 +2,7 @@
 
 #include "qm_base/appbase.h"
 #include "qm_base/msgfunction.h"
-#include "qm_rps/hingesiderules.h"
+#include "qm_rps/hinge/hingesiderules.h"
 
 #include <algorithm>
 #include <cmath>

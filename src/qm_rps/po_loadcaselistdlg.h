@@ -1,7 +1,7 @@
 // Model of the list of pushover load cases: add, modify, copy, delete.
 #pragma once
 
-#include "qm_rps/loadcaserows.h"
+#include "qm_rps/pushover/loadcaserows.h"
 #include "qm_rps/rpsdlgbase.h"
 
 class CPO_LoadCaseListDlg : public CRPSDlgBase {

@@ -1,7 +1,7 @@
 // Model of the choice of one pushover load case.
 #pragma once
 
-#include "qm_rps/loadcaserows.h"
+#include "qm_rps/pushover/loadcaserows.h"
 #include "qm_rps/rpsdlgbase.h"
 
 class CPO_SelectLoadCaseDlg : public CRPSDlgBase {

@@ -5,8 +5,8 @@
 #include "qm_base/logfile.h"
 #include "qm_base/testenvmgr.h"
 #include "qm_base/textformat.h"
-#include "qm_rps/fema440coefficients.h"
-#include "qm_rps/pushoverbilinear.h"
+#include "qm_rps/pushover/fema440coefficients.h"
+#include "qm_rps/pushover/pushoverbilinear.h"
 
 #include <algorithm>
 #include <array>

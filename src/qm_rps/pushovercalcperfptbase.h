@@ -7,7 +7,7 @@
 // Units: Sd in the model's length, Sa in g, periods in s, damping in per cent.
 #pragma once
 
-#include "qm_rps/pushoverperfptrecord.h"
+#include "qm_rps/pushover/pushoverperfptrecord.h"
 
 /// Result codes of CalcPerformancePoint and IteratePerformancePoint.
 inline constexpr int kPerfPtNone = 0;

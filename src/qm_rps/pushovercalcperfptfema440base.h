@@ -1,7 +1,7 @@
 // What the FEMA 440 (2005) chapter 6 procedures share beyond ATC-40.
 #pragma once
 
-#include "qm_rps/fema440workingspectrum.h"
+#include "qm_rps/pushover/fema440workingspectrum.h"
 #include "qm_rps/pushovercalcperfptbase.h"
 
 class CPushOverCalcPerfPtFEMA440Base : public CPushOverCalcPerfPtBase {

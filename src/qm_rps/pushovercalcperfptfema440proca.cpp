@@ -1,6 +1,6 @@
 #include "qm_rps/pushovercalcperfptfema440proca.h"
 
-#include "qm_rps/fema440coefficients.h"
+#include "qm_rps/pushover/fema440coefficients.h"
 
 #include "qm_base/debugout.h"
 

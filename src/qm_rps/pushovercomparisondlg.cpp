@@ -2,7 +2,7 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
-#include "qm_rps/recordnames.h"
+#include "qm_rps/desk/recordnames.h"
 
 using zql::lib::MMSGFunction;
 

@@ -1,8 +1,8 @@
 // Model of the comparison window: every method on one load case with one spectrum.
 #pragma once
 
-#include "qm_rps/pushovercomparison.h"
-#include "qm_rps/texttable.h"
+#include "qm_rps/dialog/texttable.h"
+#include "qm_rps/pushover/pushovercomparison.h"
 
 class CPushOverComparisonDlg : public zql::frx::MDialog {
 public:

@@ -2,11 +2,11 @@
 #include "qm_rps/pushovercurveedit.h"
 
 #include "qm_base/msgfunction.h"
+#include "qm_rps/desk/recordnames.h"
+#include "qm_rps/pushover/pushoverreport.h"
 #include "qm_rps/pushovercomparisondlg.h"
 #include "qm_rps/pushovercurvedampparamuser.h"
-#include "qm_rps/pushoverreport.h"
 #include "qm_rps/pushovertextdlg.h"
-#include "qm_rps/recordnames.h"
 
 using zql::lib::MMSGFunction;
 

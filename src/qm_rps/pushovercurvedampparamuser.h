@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_rps/pushoverperfptrecord.h"
+#include "qm_rps/pushover/pushoverperfptrecord.h"
 
 class CPushOverCurveDampParamUser : public zql::frx::MDialog {
 public:

@@ -4,10 +4,10 @@
 // One evaluation is: SetEvaluation, Evaluate, Result. Nothing is shown but through messages.
 #pragma once
 
-#include "qm_rps/pushevaluation.h"
+#include "qm_rps/pushover/pushevaluation.h"
+#include "qm_rps/pushover/pushovertargetevaluation.h"
 #include "qm_rps/pushoveradditionalstepdlg.h"
 #include "qm_rps/pushovercalcperfptbase.h"
-#include "qm_rps/pushovertargetevaluation.h"
 
 #include <memory>
 

@@ -1,10 +1,10 @@
 #include "qm_rps/pushovercurveedit.h"
 
 #include "qm_base/msgfunction.h"
+#include "qm_rps/desk/recordnames.h"
 #include "qm_rps/pushovercurvedampparamuser.h"
 #include "qm_rps/pushovercurvesub1dlg.h"
 #include "qm_rps/pushovercurvesub4dlg.h"
-#include "qm_rps/recordnames.h"
 
 namespace {
 

@@ -5,8 +5,8 @@
 // last picture and values, with the reason.
 #pragma once
 
-#include "qm_rps/hingefindings.h"
-#include "qm_rps/pushovercells.h"
+#include "qm_rps/hinge/hingefindings.h"
+#include "qm_rps/pushover/pushovercells.h"
 #include "qm_rps/pushovercurvedlg.h"
 
 /// What of a picture is drawn. Guide lines hides all three kinds.

@@ -1,7 +1,7 @@
 #include "qm_rps/pushovercurvesub1dlg.h"
 
 #include "qm_base/msgfunction.h"
-#include "qm_rps/pushevaluation.h"
+#include "qm_rps/pushover/pushevaluation.h"
 
 namespace {
 

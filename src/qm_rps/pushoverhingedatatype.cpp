@@ -1,7 +1,7 @@
 #include "qm_rps/pushoverhingedatatype.h"
 
 #include "qm_base/msgfunction.h"
-#include "qm_rps/hingemirror.h"
+#include "qm_rps/hinge/hingemirror.h"
 #include "qm_rps/po_hingetypelistdlg.h"
 
 #include <algorithm>

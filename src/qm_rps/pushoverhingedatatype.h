@@ -4,9 +4,9 @@
 #pragma once
 
 #include "qm_db/records.h"
-#include "qm_rps/hingedialog.h"
-#include "qm_rps/hingelabels.h"
-#include "qm_rps/hingesiderules.h"
+#include "qm_rps/dialog/hingedialog.h"
+#include "qm_rps/hinge/hingelabels.h"
+#include "qm_rps/hinge/hingesiderules.h"
 
 #include <functional>
 #include <optional>

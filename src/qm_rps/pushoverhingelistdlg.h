@@ -2,7 +2,6 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_db/hingerecords.h"
 #include "qm_db/records.h"
 #include "qm_rps/yieldstrengthcalcoptdlg.h"
 

@@ -1,6 +1,6 @@
 #include "qm_rps/pushovermanager.h"
 
-#include "qm_rps/docmodule.h"
+#include "qm_rps/desk/docmodule.h"
 
 CPushoverManager* CPushoverManager::Current()
 {

@@ -1,7 +1,7 @@
 #include "qm_rps/pushoverpmminteractiondlg.h"
 
 #include "qm_base/textformat.h"
-#include "qm_rps/hingesiderules.h"
+#include "qm_rps/hinge/hingesiderules.h"
 
 #include <cmath>
 

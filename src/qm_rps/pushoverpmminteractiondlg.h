@@ -1,9 +1,9 @@
 // Model of the dialog of user-defined P-M interaction curves.
 #pragma once
 
-#include "qm_db/hingerecords.h"
-#include "qm_rps/hingedialog.h"
-#include "qm_rps/hingelabels.h"
+#include "qm_db/records.h"
+#include "qm_rps/dialog/hingedialog.h"
+#include "qm_rps/hinge/hingelabels.h"
 
 class CPushOverPMMInteractionDlg : public CHingeDialog {
 public:

@@ -1,7 +1,7 @@
 // Grid of one user-defined P-M interaction curve.
 #pragma once
 
-#include "qm_rps/pmpointgrid.h"
+#include "qm_rps/dialog/pmpointgrid.h"
 
 inline constexpr std::array<const char*, 4> kPmmCurveNames{"Py-My(+)", "Py-My(-)", "Pz-Mz(+)",
                                                            "Pz-Mz(-)"};

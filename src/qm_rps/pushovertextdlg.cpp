@@ -1,6 +1,6 @@
 #include "qm_rps/pushovertextdlg.h"
 
-#include "qm_rps/pushoverreport.h"
+#include "qm_rps/pushover/pushoverreport.h"
 
 int CPushOverTextDlg::OnSave()
 {

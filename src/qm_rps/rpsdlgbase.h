@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_db/dbdoc.h"
-#include "qm_rps/hingedialog.h"
+#include "qm_rps/dialog/hingedialog.h"
 
 #include <functional>
 #include <memory>

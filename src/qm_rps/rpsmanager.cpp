@@ -1,6 +1,6 @@
 #include "qm_rps/rpsmanager.h"
 
-#include "qm_rps/docmodule.h"
+#include "qm_rps/desk/docmodule.h"
 
 namespace {
 constexpr const char* kSource = "src/qm_rps/rpsmanager";

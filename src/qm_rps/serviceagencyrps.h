@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_base/serviceheadoffice.h"
-#include "qm_db/hingerecords.h"
+#include "qm_db/records.h"
 
 #include <map>
 #include <vector>

@@ -3,7 +3,7 @@
 #pragma once
 
 #include "qm_db/dbdoc.h"
-#include "qm_rps/pushevaluation.h"
+#include "qm_rps/pushover/pushevaluation.h"
 
 /// A storey, bottom to top.
 struct T_REPORT_STOREY {

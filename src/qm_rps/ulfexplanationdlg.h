@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_rps/ulfexplain.h"
+#include "qm_rps/factors/ulfexplain.h"
 
 class CUlfExplanationDlg : public zql::frx::MDialog {
 public:

@@ -2,9 +2,9 @@
 
 #include "qm_base/messagehistory.h"
 #include "qm_base/msgfunction.h"
-#include "qm_rps/ulfchecks.h"
+#include "qm_rps/factors/ulfchecks.h"
+#include "qm_rps/factors/ulfstageplace.h"
 #include "qm_rps/ulfexplanationdlg.h"
-#include "qm_rps/ulfstageplace.h"
 #include "qm_rps/unknownloadfactorresultdlg.h"
 
 #include <algorithm>

@@ -2,9 +2,9 @@
 // construction stages: name, objective, sign, constraints, and what a calculation leaves.
 #pragma once
 
-#include "qm_rps/hingedialog.h"
-#include "qm_rps/ulfanalysis.h"
-#include "qm_rps/ulfexplain.h"
+#include "qm_rps/dialog/hingedialog.h"
+#include "qm_rps/factors/ulfanalysis.h"
+#include "qm_rps/factors/ulfexplain.h"
 
 class CUlfItemDialog : public CHingeDialog {
 public:

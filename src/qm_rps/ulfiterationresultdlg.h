@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_rps/ulfiterationreport.h"
+#include "qm_rps/factors/ulfiterationreport.h"
 
 #include <array>
 

@@ -3,7 +3,7 @@
 #include "qm_base/messagehistory.h"
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
-#include "qm_rps/ulfiterationdochost.h"
+#include "qm_rps/factors/ulfiterationdochost.h"
 #include "qm_rps/unknownloadfactoriteranaldlg.h"
 #include "qm_rps/unknownloadfactorresultdlg.h"
 

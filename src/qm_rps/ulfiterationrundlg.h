@@ -3,8 +3,8 @@
 #pragma once
 
 #include "qm_db/dbdoc.h"
+#include "qm_rps/factors/ulfstageresults.h"
 #include "qm_rps/ulfiterationresultdlg.h"
-#include "qm_rps/ulfstageresults.h"
 #include "qm_rps/unknownloadfactoriteranal.h"
 #include "qm_rps/unknownstageitemdlg.h"
 

@@ -1,9 +1,9 @@
 #include "qm_rps/unknownloadfactorconstraintdlg.h"
 
 #include "qm_base/msgfunction.h"
-#include "qm_rps/ulfchecks.h"
-#include "qm_rps/ulfstageplace.h"
-#include "qm_rps/ulftexts.h"
+#include "qm_rps/factors/ulfchecks.h"
+#include "qm_rps/factors/ulfstageplace.h"
+#include "qm_rps/factors/ulftexts.h"
 
 #include <algorithm>
 #include <tuple>

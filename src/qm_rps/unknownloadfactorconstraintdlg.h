@@ -3,7 +3,7 @@
 #pragma once
 
 #include "qm_db/dbdoc.h"
-#include "qm_rps/hingedialog.h"
+#include "qm_rps/dialog/hingedialog.h"
 
 class CUnknownLoadFactorConstraintDlg : public CHingeDialog {
 public:

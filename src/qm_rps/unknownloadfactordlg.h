@@ -4,8 +4,8 @@
 
 #include "qm_base/mdialog.h"
 #include "qm_db/dbdoc.h"
+#include "qm_rps/factors/ulfstageresults.h"
 #include "qm_rps/ulfitemdialog.h"
-#include "qm_rps/ulfstageresults.h"
 
 #include <memory>
 

@@ -1,7 +1,7 @@
 #include "qm_rps/unknownloadfactoritemdlg.h"
 
 #include "qm_base/textformat.h"
-#include "qm_rps/ulfchecks.h"
+#include "qm_rps/factors/ulfchecks.h"
 
 #include <algorithm>
 

@@ -2,9 +2,9 @@
 // constraints, and the calculation of its factors.
 #pragma once
 
-#include "qm_rps/ulfinfluencecache.h"
+#include "qm_rps/factors/ulfinfluencecache.h"
+#include "qm_rps/factors/ulfstaticresponse.h"
 #include "qm_rps/ulfitemdialog.h"
-#include "qm_rps/ulfstaticresponse.h"
 
 class CUnknownLoadFactorItemDlg : public CUlfItemDialog {
 public:

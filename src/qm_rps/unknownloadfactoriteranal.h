@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_base/dynmodule.h"
-#include "qm_rps/ulfiteration.h"
+#include "qm_rps/factors/ulfiteration.h"
 
 class CUnknownLoadFactorIterAnal : public CDynModule {
 public:

@@ -4,7 +4,7 @@
 
 #include "qm_base/mdialog.h"
 #include "qm_db/dbdoc.h"
-#include "qm_rps/ulfsheet.h"
+#include "qm_rps/factors/ulfsheet.h"
 
 class CUnknownLoadFactorResultDlg : public zql::frx::MDialog {
 public:

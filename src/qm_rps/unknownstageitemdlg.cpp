@@ -2,8 +2,8 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/factors/ulfstageplace.h"
 #include "qm_rps/ulfiterationrundlg.h"
-#include "qm_rps/ulfstageplace.h"
 
 #include <algorithm>
 #include <tuple>

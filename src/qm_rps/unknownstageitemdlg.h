@@ -2,9 +2,9 @@
 // and step, objective, sign and constraints, and the calculation of its factors.
 #pragma once
 
+#include "qm_rps/factors/ulfiteration.h"
+#include "qm_rps/factors/ulfstageproblem.h"
 #include "qm_rps/ulfitemdialog.h"
-#include "qm_rps/ulfiteration.h"
-#include "qm_rps/ulfstageproblem.h"
 
 class CUnknownStageItemDlg : public CUlfItemDialog {
 public:

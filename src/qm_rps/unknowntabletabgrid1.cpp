@@ -1,7 +1,7 @@
 #include "qm_rps/unknowntabletabgrid1.h"
 
 #include "qm_base/msgfunction.h"
-#include "qm_rps/ulfstageplace.h"
+#include "qm_rps/factors/ulfstageplace.h"
 #include "qm_rps/unknownloadfactorconstraintdlg.h"
 
 #include <algorithm>

@@ -1,7 +1,7 @@
 #include "qm_rps/yieldstrengthcalcoptdlg.h"
 
 #include "qm_base/msgfunction.h"
-#include "qm_rps/elementlist.h"
+#include "qm_rps/desk/elementlist.h"
 #include "qm_rps/yieldstrengthcalcopteffdescdlg.h"
 
 #include <algorithm>

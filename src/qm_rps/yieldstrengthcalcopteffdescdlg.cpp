@@ -3,7 +3,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_db/sectionproperties.h"
-#include "qm_rps/hingelabels.h"
+#include "qm_rps/hinge/hingelabels.h"
 
 namespace {
 

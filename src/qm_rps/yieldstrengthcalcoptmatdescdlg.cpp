@@ -2,7 +2,7 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
-#include "qm_rps/hingelabels.h"
+#include "qm_rps/hinge/hingelabels.h"
 
 CYieldStrengthCalcOptMatDescDlg::CYieldStrengthCalcOptMatDescDlg(const std::vector<int>& elements,
                                                                  const T_YIELD_CALC_LOOKUP& lookup)

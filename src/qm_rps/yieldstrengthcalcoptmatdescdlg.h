@@ -3,7 +3,7 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_db/hingerecords.h"
+#include "qm_db/records.h"
 
 #include <functional>
 

@@ -1,15 +1,15 @@
 #include "qm_solver/framesolver.h"
 
 #include "qm_base/textformat.h"
-#include "qm_solver/balance.h"
-#include "qm_solver/caseblock.h"
-#include "qm_solver/frameassembly.h"
-#include "qm_solver/frameextent.h"
-#include "qm_solver/mechanism.h"
-#include "qm_solver/modelcheck.h"
+#include "qm_solver/checks/balance.h"
+#include "qm_solver/checks/mechanism.h"
+#include "qm_solver/checks/modelcheck.h"
+#include "qm_solver/checks/stabilitycheck.h"
+#include "qm_solver/frame/caseblock.h"
+#include "qm_solver/frame/frameassembly.h"
+#include "qm_solver/model/frameextent.h"
 #include "qm_solver/modesolver.h"
-#include "qm_solver/sparsefactor.h"
-#include "qm_solver/stabilitycheck.h"
+#include "qm_solver/sparse/sparsefactor.h"
 
 #include <algorithm>
 #include <cmath>

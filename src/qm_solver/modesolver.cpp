@@ -1,8 +1,8 @@
 #include "qm_solver/modesolver.h"
 
-#include "qm_solver/eigensolver.h"
-#include "qm_solver/framemass.h"
-#include "qm_solver/movement.h"
+#include "qm_solver/checks/movement.h"
+#include "qm_solver/frame/eigensolver.h"
+#include "qm_solver/model/framemass.h"
 
 #include <algorithm>
 #include <cmath>

@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_solver/framesolver.h"
-#include "qm_solver/sparsefactor.h"
+#include "qm_solver/sparse/sparsefactor.h"
 
 namespace solver {
 

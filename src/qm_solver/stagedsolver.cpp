@@ -1,6 +1,6 @@
 #include "qm_solver/stagedsolver.h"
 
-#include "qm_solver/stagedrun.h"
+#include "qm_solver/stages/stagedrun.h"
 
 #include <algorithm>
 

@@ -1,7 +1,7 @@
 #include "desktoptest.h"
 
 #include "hingetools.h"
-#include "qm_ui/plotwidget.h"
+#include "qm_ui/plot/plotwidget.h"
 
 #include <QAction>
 #include <QApplication>

@@ -7,7 +7,7 @@
 #include "qm_rps/po_loadcasedlg.h"
 #include "qm_rps/po_loadcaselistdlg.h"
 #include "qm_rps/rps_main.h"
-#include "qm_ui/plotwidget.h"
+#include "qm_ui/plot/plotwidget.h"
 
 #include <QApplication>
 #include <QComboBox>

@@ -4,7 +4,7 @@
 #include "pushoverwindow.h"
 
 #include "qm_rps/pushovercurvedampparamuser.h"
-#include "qm_ui/plotwidget.h"
+#include "qm_ui/plot/plotwidget.h"
 
 #include <QCheckBox>
 #include <QComboBox>

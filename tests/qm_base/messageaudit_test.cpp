@@ -1,4 +1,4 @@
-#include "qm_base/messageaudit.h"
+#include "messageaudit.h"
 
 #include "qm_base/messagesources.h"
 

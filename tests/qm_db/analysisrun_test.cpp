@@ -1,5 +1,5 @@
 // Linear analysis from the records of a document to its results.
-#include "qm_db/analysismodel.h"
+#include "qm_db/analysis/analysismodel.h"
 #include "qm_db/casefile.h"
 #include "qm_db/dbdoc.h"
 

@@ -1,6 +1,6 @@
 // Edits of hinges in a document: units, undo, deletion, members, conversion.
 #include "qm_db/dbdoc.h"
-#include "qm_db/recordbody.h"
+#include "qm_db/store/recordbody.h"
 
 #include <cmath>
 #include <gtest/gtest.h>

@@ -2,8 +2,8 @@
 #include "ulfplanted.h"
 
 #include "qm_db/rps_unknownloadfactormanager.h"
-#include "qm_db/ulfdiagnosis.h"
-#include "qm_db/ulffallback.h"
+#include "qm_solver/factors/ulffallback.h"
+#include "qm_solver/ulfdiagnosis.h"
 
 #include <gtest/gtest.h>
 #include <numeric>

@@ -3,7 +3,7 @@
 #include "qm_base/appbase.h"
 #include "qm_base/debugout.h"
 #include "qm_base/testenvmgr.h"
-#include "qm_rps/fema440coefficients.h"
+#include "qm_rps/pushover/fema440coefficients.h"
 #include "qm_rps/pushovercalcperfptfema440proca.h"
 #include "qm_rps/pushovercalcperfptfema440procc.h"
 

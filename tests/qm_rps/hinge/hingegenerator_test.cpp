@@ -1,6 +1,6 @@
 // Hinges generated for elements, their list, and what an element lacks.
 #include "hingesample.h"
-#include "qm_rps/hingegenerator.h"
+#include "qm_rps/hinge/hingegenerator.h"
 #include "qm_rps/pushoverhingedatatype.h"
 #include "qm_rps/pushoverhingelistdlg.h"
 #include "qm_rps/yieldstrengthcalcoptdlg.h"

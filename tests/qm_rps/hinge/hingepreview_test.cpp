@@ -1,5 +1,5 @@
 #include "hingesample.h"
-#include "qm_rps/hingepreview.h"
+#include "qm_rps/hinge/hingepreview.h"
 
 #include <cmath>
 #include <gtest/gtest.h>

@@ -1,4 +1,4 @@
-#include "qm_rps/hingetheta.h"
+#include "qm_rps/hinge/hingetheta.h"
 
 #include <gtest/gtest.h>
 

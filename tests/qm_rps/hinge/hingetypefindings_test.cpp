@@ -1,8 +1,8 @@
 // Rules of a whole hinge type: what it refers to, codes, symmetry, automatic strengths, parts.
 #include "hingesample.h"
-#include "qm_rps/hingemirror.h"
-#include "qm_rps/hingepreview.h"
-#include "qm_rps/hingetypefindings.h"
+#include "qm_rps/hinge/hingemirror.h"
+#include "qm_rps/hinge/hingepreview.h"
+#include "qm_rps/hinge/hingetypefindings.h"
 #include "qm_rps/po_hingeskcvtabfemadlg.h"
 
 #include <functional>

@@ -1,4 +1,4 @@
-#include "qm_rps/sectionstrength.h"
+#include "qm_rps/hinge/sectionstrength.h"
 
 #include <cmath>
 #include <gtest/gtest.h>

@@ -1,0 +1,328 @@
+#include "analysistext.h"
+
+#include "qm_base/textformat.h"
+#include "qm_db/records/structnames.h"
+
+#include <algorithm>
+#include <cmath>
+#include <functional>
+#include <nlohmann/json.hpp>
+#include <utility>
+
+namespace {
+
+/// A column never runs into the next one: a blank stands before the widest number.
+std::string Column(double value)
+{
+    return FormatText(" %13.6g", value);
+}
+
+std::string Columns(const T_DOF6& values)
+{
+    std::string text;
+    for (const double v : values)
+        text += Column(v);
+    return text;
+}
+
+std::string Head(const char* first, const std::vector<std::string>& names)
+{
+    std::string text = FormatText("%10s", first);
+    for (const std::string& name : names)
+        text += FormatText(" %13s", name.c_str());
+    return text + "\n";
+}
+
+std::vector<std::string> Dofs(const char* a, const std::string& unitA, const char* b,
+                              const std::string& unitB)
+{
+    std::vector<std::string> out;
+    for (const char* prefix : {a, b})
+        for (const char* axis : {"X", "Y", "Z"})
+            out.push_back(std::string(prefix) + axis + " (" + (prefix == a ? unitA : unitB) + ")");
+    return out;
+}
+
+std::string NumberList(const T_DOF6& values)
+{
+    std::string text = "[";
+    for (std::size_t i = 0; i < values.size(); ++i)
+        text += (i ? ", " : "") + ShortestText(values[i]);
+    return text + "]";
+}
+
+/// {"ID": value, ...}, one to a line.
+template <class T, class F>
+std::string IdObject(const std::vector<T_BY_ID<T>>& rows, const F& print)
+{
+    std::string text = "{";
+    const char* before = "\n   \"";
+    for (const T_BY_ID<T>& row : rows) {
+        text += before + std::to_string(row.id) + "\": " + print(row.value);
+        before = ",\n   \"";
+    }
+    return text + (rows.empty() ? "}" : "\n  }");
+}
+
+/// "name": {CASE: {ID: value}}.
+template <class T, class F>
+std::string CaseObject(const char* name, const std::vector<T_SHOWN_CASE>& shown,
+                       const std::vector<T_CASE_RESULTS>& results,
+                       std::vector<T_BY_ID<T>> T_CASE_RESULTS::*rows, const F& print)
+{
+    std::string text = std::string(" \"") + name + "\": {";
+    for (std::size_t i = 0; i < shown.size(); ++i)
+        text += (i ? ",\n  " : "\n  ") + JsonText(shown[i].name) + ": " +
+                IdObject(results[i].*rows, print);
+    return text + (shown.empty() ? "}" : "\n }");
+}
+
+std::string BeamList(const T_BEAM_ROWS& rows)
+{
+    std::string text = "[";
+    for (std::size_t p = 0; p < rows.size(); ++p)
+        text += (p ? ", " : "") + NumberList(rows[p]);
+    return text + "]";
+}
+
+std::string StageObject(const T_SHOWN_STAGE& s)
+{
+    const T_CASE_RESULTS& r = s.results;
+    return FormatText("{\n  \"step\": %d, \"load\": ", s.choice.step) + JsonText(s.load) +
+           FormatText(", \"elements\": %zu,\n  \"displacements\": ", s.elements) +
+           IdObject(r.displacements, NumberList) +
+           ",\n  \"reactions\": " + IdObject(r.reactions, NumberList) +
+           ",\n  \"truss\": " + IdObject(r.trusses, ShortestText) +
+           ",\n  \"beam\": " + IdObject(r.beams, BeamList) + "\n  }";
+}
+
+std::string ModeObject(const T_MODE_RESULTS& mode)
+{
+    return "  {\n   \"period\": " + ShortestText(mode.period) +
+           ",\n   \"participation\": " + NumberList(mode.participation) +
+           ",\n   \"mass_percent\": " + NumberList(mode.massPercent) +
+           ",\n   \"shape\": " + IdObject(mode.shape, NumberList) + "\n  }";
+}
+
+constexpr double kModeRounding = 1e-10; // of the largest of all modes
+constexpr double kCaseRounding = 1e-12; // of the largest of a load case
+
+/// Without what rounding has left beside the largest.
+T_DOF6 Cleaned(T_DOF6 values, double largest, double part = kModeRounding)
+{
+    for (double& v : values)
+        if (std::fabs(v) <= part * largest) v = 0.0;
+    return values;
+}
+
+template <class ROWS>
+void Grow(double& largest, const ROWS& rows)
+{
+    for (const auto& row : rows)
+        for (const double v : row.value)
+            largest = std::max(largest, std::fabs(v));
+}
+
+/// The results as the tables show them: displacements, and forces with moments, without rounding.
+T_CASE_RESULTS WithoutRounding(T_CASE_RESULTS r)
+{
+    double moved = 0.0, force = 0.0;
+    Grow(moved, r.displacements);
+    Grow(force, r.reactions);
+    for (const auto& row : r.trusses)
+        force = std::max(force, std::fabs(row.value));
+    for (const auto& row : r.beams)
+        for (const T_DOF6& at : row.value)
+            for (const double v : at)
+                force = std::max(force, std::fabs(v));
+    for (auto& row : r.displacements)
+        row.value = Cleaned(row.value, moved, kCaseRounding);
+    for (auto& row : r.reactions)
+        row.value = Cleaned(row.value, force, kCaseRounding);
+    for (auto& row : r.trusses)
+        if (std::fabs(row.value) <= kCaseRounding * force) row.value = 0.0;
+    for (auto& row : r.beams)
+        for (T_DOF6& at : row.value)
+            at = Cleaned(at, force, kCaseRounding);
+    return r;
+}
+
+struct T_LARGEST {
+    double value = 0.0;
+    int id = 0;
+};
+
+/// The largest of a group of three components over all rows.
+template <class ROWS, class F>
+T_LARGEST Largest(const ROWS& rows, const F& size)
+{
+    T_LARGEST out;
+    for (const auto& row : rows) {
+        const double v = size(row.value);
+        if (std::fabs(v) > std::fabs(out.value)) out = {v, row.id};
+    }
+    return out;
+}
+
+double Translation(const T_DOF6& d)
+{
+    return std::hypot(d[0], d[1], d[2]);
+}
+
+std::string BeamTable(const T_CASE_RESULTS& r, const T_UNITS& units)
+{
+    std::vector<std::string> names;
+    for (std::size_t i = 0; i < 6; ++i) // "moment y (kN*m)" is too wide for its column
+        names.push_back(std::string(i == 0   ? "N"
+                                    : i == 1 ? "Vy"
+                                    : i == 2 ? "Vz"
+                                    : i == 3 ? "Mx"
+                                    : i == 4 ? "My"
+                                             : "Mz") +
+                        " (" + (i < 3 ? ForceName(units) : MomentName(units)) + ")");
+    std::string text = "\nbeam forces, local axes (internal, of the cut seen from the I side)\n" +
+                       Head("element at", names);
+    for (const auto& beam : r.beams) {
+        for (std::size_t p = 0; p < beam.value.size(); ++p) {
+            text += p == 0 ? FormatText("%6d %3s", beam.id, kPositionNames[p])
+                           : FormatText("%6s %3s", "", kPositionNames[p]);
+            text += Columns(beam.value[p]) + "\n";
+        }
+    }
+    return text;
+}
+
+double LargestOf(const std::vector<T_MODE_RESULTS>& modes, T_DOF6 T_MODE_RESULTS::*member)
+{
+    double largest = 0.0;
+    for (const T_MODE_RESULTS& mode : modes)
+        for (const double v : mode.*member)
+            largest = std::max(largest, std::fabs(v));
+    return largest;
+}
+
+} // namespace
+
+std::string ForceName(const T_UNITS& units)
+{
+    return std::string(NameOf(units.force));
+}
+
+std::string LengthName(const T_UNITS& units)
+{
+    return std::string(NameOf(units.length));
+}
+
+std::string MomentName(const T_UNITS& units)
+{
+    return ForceName(units) + "*" + LengthName(units);
+}
+
+std::string JsonText(const std::string& text)
+{
+    return nlohmann::json(text).dump(-1, ' ', false, nlohmann::json::error_handler_t::replace);
+}
+
+std::string AnalysisJson(const std::vector<T_SHOWN_CASE>& shown,
+                         const std::vector<T_CASE_RESULTS>& results,
+                         const std::vector<T_MODE_RESULTS>& modes,
+                         const std::vector<T_SHOWN_STAGE>& stages)
+{
+    std::string text = "{\n";
+    text += CaseObject("displacements", shown, results, &T_CASE_RESULTS::displacements, NumberList);
+    text += ",\n" + CaseObject("reactions", shown, results, &T_CASE_RESULTS::reactions, NumberList);
+    text += ",\n" + CaseObject("truss", shown, results, &T_CASE_RESULTS::trusses, ShortestText);
+    text += ",\n" + CaseObject("beam", shown, results, &T_CASE_RESULTS::beams, BeamList);
+    text += ",\n \"modes\": [";
+    for (std::size_t i = 0; i < modes.size(); ++i)
+        text += (i ? ",\n" : "\n") + ModeObject(modes[i]);
+    text += modes.empty() ? "]" : "\n ]";
+    const char* before = ",\n \"stages\": {\n  ";
+    for (const T_SHOWN_STAGE& stage : stages)
+        text += std::exchange(before, ",\n  ") + JsonText(stage.stage) + ": " + StageObject(stage);
+    return text + (stages.empty() ? "\n}\n" : "\n }\n}\n");
+}
+
+std::string StageTitle(const T_SHOWN_STAGE& stage)
+{
+    return "stage \"" + stage.stage + "\"" +
+           FormatText(", step %d of %d, %s, %zu elements", stage.choice.step, stage.steps,
+                      stage.load.c_str(), stage.elements);
+}
+
+std::string CaseTables(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& results,
+                       const T_UNITS& units)
+{
+    const T_CASE_RESULTS r = WithoutRounding(results);
+    const std::string force = ForceName(units), length = LengthName(units);
+    std::string text =
+        "\n== " + shown.name + "\n\ndisplacements\n" + Head("node", Dofs("D", length, "R", "rad"));
+    for (const auto& row : r.displacements)
+        text += FormatText("%10d", row.id) + Columns(row.value) + "\n";
+    text += "\nreactions (forces of the supports on the structure)\n" +
+            Head("node", Dofs("F", force, "M", MomentName(units)));
+    for (const auto& row : r.reactions)
+        text += FormatText("%10d", row.id) + Columns(row.value) + "\n";
+    if (!r.trusses.empty())
+        text += "\ntruss forces (tension positive)\n" + Head("element", {"N (" + force + ")"});
+    for (const auto& row : r.trusses)
+        text += FormatText("%10d", row.id) + Column(row.value) + "\n";
+    if (!r.beams.empty()) text += BeamTable(r, units);
+    return text;
+}
+
+std::string CaseSummary(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& r, const T_UNITS& units)
+{
+    const std::string force = ForceName(units), length = LengthName(units);
+    const T_LARGEST d = Largest(r.displacements, Translation);
+    std::string text =
+        shown.name + FormatText(": largest displacement %.6g %s", d.value, length.c_str());
+    if (d.id) text += FormatText(" at node %d", d.id);
+    T_DOF6 sum{};
+    for (const auto& row : r.reactions)
+        for (std::size_t i = 0; i < sum.size(); ++i)
+            sum[i] += row.value[i];
+    double size = 0.0; // reactions that cancel leave rounding
+    for (const auto& row : r.reactions)
+        size = std::max(
+            {size, std::fabs(row.value[0]), std::fabs(row.value[1]), std::fabs(row.value[2])});
+    for (double& s : sum)
+        if (std::fabs(s) <= 1e-10 * size) s = 0.0;
+    text += FormatText("; sum of reactions X %.6g, Y %.6g, Z %.6g %s", sum[0], sum[1], sum[2],
+                       force.c_str());
+    const T_LARGEST n = Largest(r.trusses, [](double v) { return v; });
+    if (n.id)
+        text += FormatText("; largest truss force %.6g %s in %d", n.value, force.c_str(), n.id);
+    const auto bending = [](const T_BEAM_ROWS& rows) {
+        double largest = 0.0;
+        for (const T_DOF6& row : rows)
+            largest = std::max({largest, std::fabs(row[4]), std::fabs(row[5])});
+        return largest;
+    };
+    const T_LARGEST m = Largest(r.beams, bending);
+    if (m.id)
+        text += FormatText("; largest bending moment %.6g %s in %d", m.value,
+                           MomentName(units).c_str(), m.id);
+    return text + "\n";
+}
+
+std::string ModeTable(const std::vector<T_MODE_RESULTS>& modes)
+{
+    std::string text =
+        "\nmodes: period, and effective mass in per cent of each direction's total\n" +
+        Head("mode", {"T (s)", "X (%)", "Y (%)", "Z (%)", "RX (%)", "RY (%)", "RZ (%)"});
+    T_DOF6 sum{};
+    for (std::size_t i = 0; i < modes.size(); ++i) {
+        text += FormatText("%10zu", i + 1) + Column(modes[i].period) +
+                Columns(Cleaned(modes[i].massPercent, 100.0)) + "\n";
+        for (std::size_t k = 0; k < sum.size(); ++k)
+            sum[k] += modes[i].massPercent[k];
+    }
+    text += FormatText("%10s %13s", "sum", "") + Columns(Cleaned(sum, 100.0)) +
+            "\n\nparticipation factors\n" + Head("mode", {"X", "Y", "Z", "RX", "RY", "RZ"});
+    const double largest = LargestOf(modes, &T_MODE_RESULTS::participation);
+    for (std::size_t i = 0; i < modes.size(); ++i)
+        text +=
+            FormatText("%10zu", i + 1) + Columns(Cleaned(modes[i].participation, largest)) + "\n";
+    return text;
+}

@@ -1,0 +1,196 @@
+#include "commands.h"
+
+#include "inputfile.h"
+#include "output.h"
+#include "qm_db/casefile.h"
+#include "qm_db/filectrl.h"
+#include "qm_db/modelstore.h"
+#include "qm_rps/pushover/pushovercomparison.h"
+#include "qm_rps/pushover/pushoverreport.h"
+#include "qm_rps/pushovercurvedlg.h"
+#include "resultjson.h"
+#include "resulttable.h"
+
+#ifdef QM_UI
+#include "qm_ui/pushover/comparisonplot.h"
+#include "qm_ui/pushover/evaluationplot.h"
+#endif
+
+#include <algorithm>
+#include <cstdio>
+#include <vector>
+
+namespace {
+
+/// Additional steps and spectra; false after a message on stderr.
+bool AddExtras(CPushOverCurveDlg& driver, const T_EVALUATE_OPTIONS& options)
+{
+    const auto refused = [&](const std::string& what) {
+        const auto& messages = driver.Messages();
+        Complain(EXIT_CODE::Usage, what + ": " +
+                                       (messages.empty() ? "not possible with this evaluation"
+                                                         : messages.back().text));
+        return false;
+    };
+    for (const int step : options.steps) {
+        if (!driver.OnPushoverCurveAddStep(step)) return refused("step " + std::to_string(step));
+    }
+    for (const std::string& spectrum : options.spectra) {
+        if (!driver.CalcAdditionalPerformancePoint(spectrum))
+            return refused("spectrum \"" + spectrum + "\"");
+    }
+    return true;
+}
+
+/// Evaluates what was asked for; false after a message on stderr.
+EXIT_CODE EvaluateAll(CDBDoc& doc, const T_EVALUATE_OPTIONS& options,
+                      std::vector<T_PUSH_EVALUATION>& out)
+{
+    const std::string& only = options.only;
+    CPushOverCurveDlg driver(doc);
+    for (const auto& entry : doc.Data().Model().evaluations) {
+        if (!only.empty() && entry.second.name != only) continue;
+        T_EVAL_D eval;
+        if (!doc.Attr().GetEval(entry.first, eval)) continue;
+        if (!driver.SetEvaluation(eval))
+            return Complain(EXIT_CODE::BadInput, doc.Path() + ": evaluation \"" + eval.name +
+                                                     "\": " + driver.SettingsError());
+        driver.Evaluate();
+        if (!AddExtras(driver, options)) return EXIT_CODE::Usage;
+        out.push_back(driver.Result());
+    }
+    if (!out.empty()) return EXIT_CODE::Done;
+    if (only.empty()) return Complain(EXIT_CODE::BadInput, doc.Path() + ": no evaluations");
+    return Complain(EXIT_CODE::Usage, doc.Path() + ": no evaluation named \"" + only + "\"");
+}
+
+/// The path itself for one evaluation; for several a number before the extension.
+std::string NumberedPath(const std::string& path, std::size_t index, std::size_t count)
+{
+    if (count == 1) return path;
+    const std::string stem = CFileCtrl::GetFilePathAndNameWithoutExtension(path);
+    return stem + "-" + std::to_string(index + 1) + path.substr(stem.size());
+}
+
+EXIT_CODE WritePlots(const std::string& path, const std::vector<T_PUSH_EVALUATION>& results)
+{
+#ifdef QM_UI
+    for (std::size_t i = 0; i < results.size(); ++i) {
+        const std::string file = NumberedPath(path, i, results.size());
+        if (const EXIT_CODE code = WritePicture(EvaluationPlot(results[i]), file);
+            code != EXIT_CODE::Done)
+            return code;
+    }
+    return EXIT_CODE::Done;
+#else
+    (void)results;
+    return CheckPlotName(path);
+#endif
+}
+
+/// Reports of several evaluations follow one another in one file.
+EXIT_CODE WriteReports(const std::string& path, const std::vector<T_PUSH_EVALUATION>& results,
+                       std::string (*print)(const T_PUSH_EVALUATION&))
+{
+    std::string text;
+    for (const T_PUSH_EVALUATION& e : results)
+        text += print(e);
+    return WriteOutput(path, text);
+}
+
+/// Keeps the limit-state steps that the evaluations found; a file that can't be written is no
+/// failure of the evaluation.
+void StoreSteps(CDBDoc& doc)
+{
+    T_FILE_ERROR error;
+    if (!doc.SaveModel(error))
+        std::fprintf(stderr, "qm-rps: the limit-state steps were not stored: %s\n",
+                     error.text.c_str());
+}
+
+EXIT_CODE WriteResults(const T_EVALUATE_OPTIONS& o, const std::vector<T_PUSH_EVALUATION>& results)
+{
+    EXIT_CODE code = EXIT_CODE::Done;
+    const auto ok = [&] { return code == EXIT_CODE::Done; };
+    if (!o.json.empty()) code = WriteOutput(o.json, ResultJson(results));
+    if (ok() && !o.report.empty()) code = WriteReports(o.report, results, PushoverReportText);
+    if (ok() && !o.curve.empty()) code = WriteReports(o.curve, results, PushoverCurveText);
+    if (ok() && !o.plot.empty()) code = WritePlots(o.plot, results);
+    return code;
+}
+
+} // namespace
+
+EXIT_CODE RunImport(const std::string& caseFile, const std::string& modelFile)
+{
+    CDBDoc doc;
+    T_FILE_ERROR error;
+    if (!doc.ImportCase(caseFile, error)) return ReportFileError(error);
+    if (!doc.SaveModelAs(modelFile, error)) return ReportFileError(error);
+    std::printf("%s", InfoText(doc).c_str());
+    return EXIT_CODE::Done;
+}
+
+EXIT_CODE RunExport(const std::string& modelFile, const std::string& caseFile)
+{
+    CDBDoc doc;
+    if (const EXIT_CODE code = OpenInput(doc, modelFile); code != EXIT_CODE::Done) return code;
+    T_FILE_ERROR error;
+    std::string text;
+    if (!CCaseFile::Print(doc.Data().Content(), text, error)) return ReportFileError(error);
+    return WriteOutput(caseFile, text);
+}
+
+EXIT_CODE RunInfo(const std::string& file, bool check)
+{
+    if (check && IsModelFile(file)) {
+        T_FILE_ERROR error;
+        if (!CModelStore::CheckWhole(file, error)) return ReportFileError(error);
+    }
+    CDBDoc doc;
+    if (const EXIT_CODE code = OpenInput(doc, file); code != EXIT_CODE::Done) return code;
+    std::printf("%s", InfoText(doc).c_str());
+    if (check) std::printf("  every table and every result block was read and is whole\n");
+    return EXIT_CODE::Done;
+}
+
+EXIT_CODE RunCompare(const T_COMPARE_OPTIONS& o)
+{
+    if (const EXIT_CODE code = CheckPlotName(o.plot); code != EXIT_CODE::Done) return code;
+    CDBDoc doc;
+    if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
+    T_PUSH_COMPARISON comparison;
+    std::string error;
+    if (!ComparePushover(doc, o.push, o.spectrum, o.behavior, comparison, error))
+        return Complain(EXIT_CODE::Usage, o.file + ": " + error);
+    EXIT_CODE code = EXIT_CODE::Done;
+    if (!o.json.empty()) code = WriteOutput(o.json, ResultJson(comparison.results));
+#ifdef QM_UI
+    if (code == EXIT_CODE::Done && !o.plot.empty())
+        code = WritePicture(ComparisonPlot(comparison), o.plot);
+#endif
+    if (code != EXIT_CODE::Done) return code;
+    if (o.json != "-") std::printf("%s", ComparisonTable(comparison).c_str());
+    const bool all = std::ranges::all_of(comparison.rows, &T_COMPARISON_ROW::found);
+    return all ? EXIT_CODE::Done : EXIT_CODE::NotFound;
+}
+
+EXIT_CODE RunEvaluate(const T_EVALUATE_OPTIONS& o)
+{
+    if (const EXIT_CODE code = CheckPlotName(o.plot); code != EXIT_CODE::Done) return code;
+    CDBDoc doc;
+    if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
+    std::vector<T_PUSH_EVALUATION> results;
+    if (const EXIT_CODE code = EvaluateAll(doc, o, results); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = WriteResults(o, results); code != EXIT_CODE::Done) return code;
+    if (o.json != "-") std::printf("%s", ResultTable(results).c_str());
+    if (o.trace && o.json != "-") {
+        for (const T_PUSH_EVALUATION& e : results)
+            std::printf("%s", TraceTable(e).c_str());
+    }
+    if (IsModelFile(o.file) && !o.noStore && doc.Data().IsModified()) StoreSteps(doc);
+    for (const T_PUSH_EVALUATION& e : results) {
+        if (e.result == kPerfPtNone) return EXIT_CODE::NotFound;
+    }
+    return EXIT_CODE::Done;
+}

@@ -1,0 +1,145 @@
+// Commands that edit or draw a hinge type.
+#include "hingetools.h"
+#include "qm_base/msgfunction.h"
+#include "qm_rps/hinge/hingemirror.h"
+#include "qm_rps/hinge/sectionstrength.h"
+#include "qm_rps/po_hingeskcvtabfemaaxialgrid.h"
+#include "qm_rps/po_hingeskcvtabfemadlg.h"
+
+#ifdef QM_UI
+#include "qm_ui/hinge/hingeplot.h"
+#endif
+
+#include <algorithm>
+#include <cmath>
+
+namespace {
+
+/// Puts a changed type back as one undoable step.
+EXIT_CODE StoreType(CDBDoc& doc, int key, T_PHGT_D& type, const std::string& out)
+{
+    for (T_HINGE_COMPONENT& component : type.components)
+        component = MirroredComponent(component);
+    if (!doc.Edit().Begin("hinge type") || !doc.Edit().Put(key, type) || !doc.Edit().Commit())
+        return Complain(EXIT_CODE::BadInput, doc.Path() + ": the hinge type can't be stored");
+    return SaveDocument(doc, out);
+}
+
+/// True where every side that the curve uses has a yield deformation to convert with.
+bool HasYieldDeform(const T_SKEL_FEMA& curve)
+{
+    constexpr double kNone = 1e-7;
+    const auto has = [&](const T_SIDES<T_SKEL_SIDE>& s) {
+        return std::fabs(s.pos.yieldDeform) >= kNone &&
+               (curve.symmetric || std::fabs(s.neg.yieldDeform) >= kNone);
+    };
+    if (!curve.multiCurve) return has(curve.sides);
+    return std::ranges::all_of(curve.curves, [&](const T_SKEL_AXIAL& a) { return has(a.sides); });
+}
+
+} // namespace
+
+EXIT_CODE RunHingeConvert(const T_HINGE_OPTIONS& o)
+{
+    CDBDoc doc;
+    int key = 0;
+    T_PHGT_D type;
+    if (const EXIT_CODE code = OpenType(doc, o, key, type); code != EXIT_CODE::Done) return code;
+    const SKEL_MEASURE to = o.to == "plastic" ? SKEL_MEASURE::Plastic : SKEL_MEASURE::DDy;
+    int switched = 0;
+    bool noYield = false; // a switch without a yield deformation would make every value 0
+    for (std::size_t c = 0; c < type.components.size(); ++c) {
+        if (!type.components[c].active ||
+            (!o.component.empty() && o.component != kComponentNames[c]))
+            continue;
+        ForEachPage(type.components[c], [&](HINGE_END, T_SKEL_CURVE& curve) {
+            auto* fema = std::get_if<T_SKEL_FEMA>(&curve);
+            if (!fema || fema->measure == to) return;
+            if (!HasYieldDeform(*fema)) noYield = true;
+            switched += to == SKEL_MEASURE::Plastic
+                            ? CPO_HingeSkcvTabFemaDlg::ConvertHingeParamPR2DDy(*fema)
+                            : CPO_HingeSkcvTabFemaDlg::ConvertHingeParamDDy2PR(*fema);
+        });
+    }
+    if (switched == 0 && !noYield)
+        return Complain(EXIT_CODE::Usage,
+                        o.file + ": hinge type \"" + o.type + "\" has no curve to switch");
+    if (noYield)
+        return Complain(EXIT_CODE::Usage, o.file + ": hinge type \"" + o.type +
+                                              "\": a curve has no yield deformation; enter "
+                                              "yield_deform first (see qm-rps hinge yield)");
+    std::printf("%d curves switched\n", switched);
+    return StoreType(doc, key, type, o.out);
+}
+
+EXIT_CODE RunHingeAxial(const T_HINGE_OPTIONS& o)
+{
+    CDBDoc doc;
+    int key = 0;
+    T_PHGT_D type;
+    if (const EXIT_CODE code = OpenType(doc, o, key, type); code != EXIT_CODE::Done) return code;
+    const auto component = ComponentOf(o.component);
+    HINGE_END page{};
+    T_SKEL_CURVE* curve =
+        component ? PageOf(type.components[static_cast<std::size_t>(*component)], o.end, page)
+                  : nullptr;
+    auto* fema = curve ? std::get_if<T_SKEL_FEMA>(curve) : nullptr;
+    if (!fema) return Complain(EXIT_CODE::Usage, o.file + ": that component has no FEMA curve");
+    CPO_HingeSkcvTabFemaAxialGrid grid;
+    grid.Data2Dlg(fema->curves);
+    bool ok = true;
+    for (const double axial : o.add)
+        ok = ok && grid.AddForce(axial);
+    for (const double axial : o.remove)
+        ok = ok && grid.RemoveForce(axial);
+    if (o.change.size() == 2) ok = ok && grid.ChangeForce(o.change[0], o.change[1]);
+    if (!ok) return Complain(EXIT_CODE::Usage, grid.Messages().back().text);
+    grid.Dlg2Data(fema->curves, fema->sides);
+    fema->multiCurve = !fema->curves.empty();
+    if (fema->curves.size() == 1)
+        return Complain(EXIT_CODE::Usage,
+                        zql::lib::MMSGFunction::GetValue("IDS_RPS_MULTI_CURVE_COUNT"));
+    std::printf("%zu axial forces\n", fema->curves.size());
+    return StoreType(doc, key, type, o.out);
+}
+
+EXIT_CODE RunHingePlot(const T_HINGE_OPTIONS& o)
+{
+    CDBDoc doc;
+    int key = 0;
+    T_PHGT_D type;
+    if (const EXIT_CODE code = OpenType(doc, o, key, type); code != EXIT_CODE::Done) return code;
+#ifdef QM_UI
+    T_PLOT plot;
+    if (o.interaction) {
+        T_SECT_D section;
+        T_MATL_D material;
+        T_SECTION_STRENGTH strength;
+        SECT_FAULT fault{};
+        if (type.yieldSurface) {
+            plot = HingeInteractionPlot(type, type.yieldSurface->yield, "yield level, as entered");
+        } else if (doc.Attr().GetSect(type.section, section) &&
+                   doc.Attr().GetMatl(type.sectionMaterial, material) &&
+                   CSectionStrength::Calc(section, material, strength, fault)) {
+            plot = HingeInteractionPlot(type, strength.level, "from section " + section.name);
+        } else {
+            return Complain(EXIT_CODE::Usage, o.file + ": hinge type \"" + o.type +
+                                                  "\" has no yield surface and no section that "
+                                                  "gives one");
+        }
+    } else {
+        const auto component = ComponentOf(o.component);
+        HINGE_END page{};
+        T_SKEL_CURVE* curve =
+            component ? PageOf(type.components[static_cast<std::size_t>(*component)], o.end, page)
+                      : nullptr;
+        if (!curve) return Complain(EXIT_CODE::Usage, "choose a component, Fx to Mz");
+        plot = HingeBackbonePlot(type, *component, *curve, EndName(page));
+    }
+    if (const EXIT_CODE code = WritePicture(plot, o.out); code != EXIT_CODE::Done) return code;
+    std::printf("%s written\n", o.out.c_str());
+    return EXIT_CODE::Done;
+#else
+    return Complain(EXIT_CODE::Usage, "this qm-rps was built without pictures");
+#endif
+}

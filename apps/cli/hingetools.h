@@ -1,0 +1,38 @@
+// What the commands on hinge types share.
+#pragma once
+
+#include "hingecommands.h"
+#include "inputfile.h"
+#include "output.h"
+#include "qm_rps/hinge/hingefindings.h"
+
+#include <cstdio>
+#include <optional>
+
+EXIT_CODE NoSuchType(const std::string& file, const std::string& type);
+
+/// Calls f(key, type in current units) for the types asked for. Usage when the name is unknown.
+template <class F>
+EXIT_CODE ForEachType(CDBDoc& doc, const std::string& name, F&& f)
+{
+    bool any = false;
+    for (const auto& entry : doc.Data().Model().hingeTypes) {
+        T_PHGT_D type;
+        if ((!name.empty() && entry.second.name != name) || !doc.Attr().GetPhgt(entry.first, type))
+            continue;
+        any = true;
+        f(entry.first, type);
+    }
+    return any || name.empty() ? EXIT_CODE::Done : NoSuchType(doc.Path(), name);
+}
+
+std::optional<HINGE_COMPONENT> ComponentOf(const std::string& name);
+
+/// "I-end", "J-end" or "both ends".
+const char* EndName(HINGE_END end);
+
+/// Opens the document and takes the type of that name with its key.
+EXIT_CODE OpenType(CDBDoc& doc, const T_HINGE_OPTIONS& o, int& key, T_PHGT_D& type);
+
+/// The curve of the page that the options name, or null.
+T_SKEL_CURVE* PageOf(T_HINGE_COMPONENT& component, const std::string& end, HINGE_END& page);

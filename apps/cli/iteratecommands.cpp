@@ -1,0 +1,210 @@
+#include "iteratecommands.h"
+
+#include "analysistext.h"
+#include "inputfile.h"
+#include "output.h"
+#include "qm_base/textformat.h"
+#include "qm_rps/factors/ulfiterationdochost.h"
+#include "qm_rps/factors/ulfstageresults.h"
+#include "qm_rps/ulfiterationresultdlg.h"
+#include "qm_rps/unknownloadfactoriteranal.h"
+#include "ulfrun.h"
+
+#ifdef QM_UI
+#include "qm_ui/factors/iterationplot.h"
+#endif
+
+#include <algorithm>
+#include <atomic>
+#include <csignal>
+#include <cstdio>
+#include <filesystem>
+#include <unistd.h>
+
+namespace {
+
+std::atomic<bool> g_cancel{false}; // set by an interrupt
+
+/// While it lives, an interrupt ends the run; the iteration at hand is taken back.
+struct T_INTERRUPT {
+    T_INTERRUPT() : before(std::signal(SIGINT, [](int) { g_cancel = true; })) {}
+    ~T_INTERRUPT() { std::signal(SIGINT, before); }
+    T_INTERRUPT(const T_INTERRUPT&) = delete;
+    T_INTERRUPT& operator=(const T_INTERRUPT&) = delete;
+    void (*before)(int);
+};
+
+/// Wants every iteration, and the report as the options say.
+class CIterateView : public zql::frx::IDialogView {
+public:
+    explicit CIterateView(bool overwrite) : m_overwrite(overwrite) {}
+    std::string m_message; // the latest one
+    void ShowMessage(const std::string&, const std::string& text) override { m_message = text; }
+    bool AskYesNo(const std::string&, const std::string&) override { return m_overwrite; }
+    int RunModal(zql::frx::MDialog& child) override
+    {
+        auto* dialog = dynamic_cast<CUlfIterationResultDlg*>(&child);
+        if (dialog) dialog->m_iterate = true;
+        return dialog ? child.OnOK() : 0;
+    }
+
+private:
+    bool m_overwrite;
+};
+
+/// A line on a terminal that changes with each iteration.
+class CProgressLine {
+public:
+    bool operator()(int done, int required)
+    {
+        if (done != m_shown && isatty(STDERR_FILENO)) {
+            std::fprintf(stderr, "\rqm-rps: %d of at most %d iterations done", done, required);
+            std::fflush(stderr);
+        }
+        m_shown = done;
+        return !g_cancel;
+    }
+
+private:
+    int m_shown = -1;
+};
+
+struct T_END_WORDS {
+    ULF_ITER_END end;
+    const char* status;
+    EXIT_CODE code;
+};
+constexpr T_END_WORDS kEnds[] = {
+    {ULF_ITER_END::Converged, "converged", EXIT_CODE::Done},
+    {ULF_ITER_END::Required, "not converged", EXIT_CODE::NotFound},
+    {ULF_ITER_END::Declined, "declined", EXIT_CODE::NotFound},
+    {ULF_ITER_END::Cancelled, "cancelled", EXIT_CODE::NotFound},
+    {ULF_ITER_END::NotSolved, "no factors found", EXIT_CODE::NotFound},
+    {ULF_ITER_END::ReportNotWritten, "report not written", EXIT_CODE::NoAccess},
+    {ULF_ITER_END::NotSaved, "model copy not saved", EXIT_CODE::NoAccess},
+    {ULF_ITER_END::NotScaled, "pretension not changed", EXIT_CODE::BadInput},
+    {ULF_ITER_END::NotAnalysed, "not analysed", EXIT_CODE::BadInput},
+};
+
+T_END_WORDS WordsOf(const CUlfIteration& run, const T_ITERATE_OPTIONS& o, bool met)
+{
+    const bool done = run.End() == ULF_ITER_END::Required ? o.iterations == 0
+                                                          : run.End() == ULF_ITER_END::Converged;
+    if (done && !met) return {run.End(), "constraints not met", EXIT_CODE::NotFound};
+    if (run.End() == ULF_ITER_END::Required && o.iterations == 0)
+        return {run.End(), "solved", EXIT_CODE::Done};
+    for (const T_END_WORDS& words : kEnds)
+        if (words.end == run.End()) return words;
+    return kEnds[0];
+}
+
+std::string StepJson(const T_ULF_ITER_STEP& step)
+{
+    std::string text = FormatText("{\"iteration\": %d, \"file\": ", step.iteration) +
+                       JsonText(step.file) + ", \"tolerance\": " + ShortestText(step.tolerance) +
+                       ", \"factors\": [";
+    for (std::size_t i = 0; i < step.rows.size(); ++i)
+        text += std::string(i ? ", " : "") + "{\"place\": " + JsonText(step.rows[i].place) +
+                ", \"case\": " + JsonText(step.rows[i].load) +
+                ", \"factor\": " + ShortestText(step.rows[i].factor + 0.0) +
+                ", \"pretension\": " + (step.rows[i].pretension ? "true" : "false") + "}";
+    return text + "]}";
+}
+
+std::string HistoryJson(const CUlfIteration& run, const char* status)
+{
+    std::string text = "{\n \"status\": " + JsonText(status) +
+                       ",\n \"report\": " + JsonText(run.ReportPath()) + ",\n \"history\": [";
+    for (const T_ULF_ITER_STEP& step : run.History())
+        text += (step.iteration ? ",\n  " : "\n  ") + StepJson(step);
+    text += "\n ],\n \"applied\": [";
+    const std::vector<double> applied = UlfIterApplied(run.History());
+    for (std::size_t i = 0; i < applied.size(); ++i)
+        text += (i ? ", " : "") + ShortestText(applied[i]);
+    return text + "]\n}\n";
+}
+
+void PrintHistory(const CUlfIteration& run)
+{
+    std::printf("%9s %14s  %s\n", "iteration", "tolerance", "model");
+    for (const T_ULF_ITER_STEP& step : run.History())
+        std::printf("%9d %14.6g  %s\n", step.iteration, step.tolerance, step.file.c_str());
+    if (run.History().empty()) return;
+    const std::vector<double> applied = UlfIterApplied(run.History());
+    std::printf("\n%-30s %-16s %16s %16s  %s\n", "stage/step", "load case", "factor", "applied",
+                "pretension");
+    const std::vector<T_ULF_ITER_ROW>& rows = run.History().back().rows;
+    for (std::size_t i = 0; i < rows.size(); ++i)
+        std::printf("%-30s %-16s %16.9g %16.9g  %s\n", rows[i].place.c_str(), rows[i].load.c_str(),
+                    rows[i].factor + 0.0, applied[i], rows[i].pretension ? "yes" : "no");
+}
+
+EXIT_CODE CheckOptions(const T_ITERATE_OPTIONS& o)
+{
+    CUnknownLoadFactorIterAnal trial;
+    if (!trial.Set({o.iterations, o.tolerance}))
+        return Complain(EXIT_CODE::Usage, "iterations must be 0 to 99, the tolerance 0 or more");
+    if (o.overwrite && o.append)
+        return Complain(EXIT_CODE::Usage, "choose --overwrite or --append, not both");
+    if (const EXIT_CODE code = CheckPlotName(o.plot); code != EXIT_CODE::Done) return code;
+    const std::string report = UlfIterReportPath(o.file);
+    std::error_code ignored;
+    if (!o.overwrite && !o.append && std::filesystem::exists(report, ignored))
+        return Complain(EXIT_CODE::NoAccess,
+                        report + ": the report is there already; say --overwrite or --append");
+    return EXIT_CODE::Done;
+}
+
+EXIT_CODE WriteResults(const CUlfIteration& run, const T_ITERATE_OPTIONS& o, const char* status)
+{
+    if (!o.json.empty()) {
+        const EXIT_CODE code = WriteOutput(o.json, HistoryJson(run, status));
+        if (code != EXIT_CODE::Done) return code;
+    }
+    if (o.json != "-") PrintHistory(run);
+#ifdef QM_UI
+    if (!o.plot.empty() && !run.History().empty())
+        return WritePicture(IterationPlot(o.item, {o.iterations, o.tolerance}, run.History()),
+                            o.plot);
+#endif
+    return EXIT_CODE::Done;
+}
+
+} // namespace
+
+EXIT_CODE RunUlfIterate(const T_ITERATE_OPTIONS& o)
+{
+    if (const EXIT_CODE code = CheckOptions(o); code != EXIT_CODE::Done) return code;
+    CDBDoc doc;
+    if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
+    int key = 0;
+    if (!doc.Attr().FindUlsi(o.item, key))
+        return Complain(EXIT_CODE::Usage,
+                        o.file + ": no construction-stage item named \"" + o.item + "\"");
+    CUlfStageResults results(doc);
+    CUnknownStageItemDlg dialog(doc, results, key);
+    dialog.m_sumStageLoads = o.sumStageLoads;
+    if (const auto findings = dialog.Findings(); !findings.empty())
+        return Complain(EXIT_CODE::BadInput, o.file + ": " + findings.front().text);
+    if (const EXIT_CODE code = AnalyseStages(doc, o.file); code != EXIT_CODE::Done) return code;
+
+    CIterateView view(o.overwrite);
+    dialog.SetView(&view);
+    CUlfIterationDocHost host(doc, dialog, &view);
+    CUnknownLoadFactorIterAnal* settings = CUnknownLoadFactorIterAnal::Of(doc.DynModules());
+    if (!settings || !settings->Set({o.iterations, o.tolerance}))
+        return Complain(EXIT_CODE::Usage, "the settings of the iteration were refused");
+    CUlfIteration run(host, settings->Settings());
+    run.m_progress = CProgressLine();
+    const T_INTERRUPT interrupt;
+    const int done = dialog.OnIterate(run);
+    if (isatty(STDERR_FILENO) && run.History().size() > 1) std::fprintf(stderr, "\n");
+    const auto& result = dialog.Result();
+    const bool met = result && std::ranges::all_of(UlfResultRows(*result), &T_ULF_RESULT_ROW::met);
+    const T_END_WORDS words = WordsOf(run, o, met);
+    const std::string reason = host.Error().empty() ? view.m_message : host.Error();
+    if (!done || words.code != EXIT_CODE::Done)
+        Complain(words.code, o.file + ": " + words.status + (reason.empty() ? "" : ": " + reason));
+    const EXIT_CODE written = WriteResults(run, o, words.status);
+    return words.code == EXIT_CODE::Done ? written : words.code;
+}

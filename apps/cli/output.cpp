@@ -1,0 +1,58 @@
+#include "output.h"
+
+#include "inputfile.h"
+#include "qm_db/filectrl.h"
+
+#ifdef QM_UI
+#include "qm_ui/plot/plotfile.h"
+#endif
+
+#include <cstdio>
+
+EXIT_CODE Complain(EXIT_CODE code, const std::string& text)
+{
+    std::fprintf(stderr, "qm-rps: %s\n", text.c_str());
+    return code;
+}
+
+EXIT_CODE CheckPlotName(const std::string& path)
+{
+    if (path.empty()) return EXIT_CODE::Done;
+#ifdef QM_UI
+    for (const char* extension : {".svg", ".pdf", ".png", ".jpg", ".jpeg", ".bmp"}) {
+        if (path.ends_with(extension)) return EXIT_CODE::Done;
+    }
+    return Complain(EXIT_CODE::Usage, path + ": a picture is .svg, .pdf, .png, .jpg or .bmp");
+#else
+    return Complain(EXIT_CODE::Usage, path + ": this qm-rps was built without pictures");
+#endif
+}
+
+EXIT_CODE WriteOutput(const std::string& path, std::string_view text)
+{
+    if (path == "-") {
+        const bool whole = std::fwrite(text.data(), 1, text.size(), stdout) == text.size();
+        return whole && std::fflush(stdout) == 0
+                   ? EXIT_CODE::Done
+                   : Complain(EXIT_CODE::NoAccess, "standard output can't be written");
+    }
+    T_FILE_ERROR error;
+    return CFileCtrl::WriteWholeFile(path, text, error) ? EXIT_CODE::Done : ReportFileError(error);
+}
+
+#ifdef QM_UI
+EXIT_CODE WritePicture(const T_PLOT& plot, const std::string& path)
+{
+    std::string error;
+    if (path.empty() || WritePlotFile(plot, path, error)) return EXIT_CODE::Done;
+    return Complain(EXIT_CODE::NoAccess, error);
+}
+#endif
+
+EXIT_CODE SaveDocument(CDBDoc& doc, const std::string& path)
+{
+    T_FILE_ERROR error;
+    const int done =
+        path.ends_with(".qmdb") ? doc.SaveModelAs(path, error) : doc.ExportCase(path, error);
+    return done ? EXIT_CODE::Done : ReportFileError(error);
+}

@@ -1,0 +1,272 @@
+#include "ulfcommands.h"
+
+#include "inputfile.h"
+#include "output.h"
+#include "qm_base/messagehistory.h"
+#include "qm_base/msgfunction.h"
+#include "qm_base/textformat.h"
+#include "qm_rps/factors/ulfstageplace.h"
+#include "qm_rps/factors/ulfstageresults.h"
+#include "qm_rps/factors/ulftexts.h"
+#include "qm_rps/unknownloadfactoritemdlg.h"
+#include "qm_rps/unknownloadfactorresultdlg.h"
+#include "qm_rps/unknownstageitemdlg.h"
+#include "ulfrun.h"
+
+#ifdef QM_UI
+#include "modelshape.h"
+#include "qm_ui/factors/ulfplot.h"
+#endif
+
+#include <algorithm>
+#include <cstdio>
+#include <ctime>
+#include <filesystem>
+#include <unistd.h>
+
+using zql::lib::MMSGFunction;
+
+namespace {
+
+EXIT_CODE OpenItem(const T_ULF_OPTIONS& o, T_ULF_OPENED& in)
+{
+    return OpenUlfItem(o.file, o.item, o.sumStageLoads, in);
+}
+
+EXIT_CODE OpenAndAnalyse(const T_ULF_OPTIONS& o, T_ULF_OPENED& in)
+{
+    const EXIT_CODE code = OpenItem(o, in);
+    return code == EXIT_CODE::Done ? AnalyseForUlf(o.file, in) : code;
+}
+
+/// Solves; a refusal or a missing solution is told on stderr.
+EXIT_CODE SolveOpened(const T_ULF_OPTIONS& o, T_ULF_OPENED& in)
+{
+    const T_ULF_OUTCOME outcome = SolveUlf(*in.dialog);
+    if (outcome.code != EXIT_CODE::Done) Complain(outcome.code, o.file + ": " + outcome.message);
+    return in.dialog->Result() ? EXIT_CODE::Done : outcome.code;
+}
+
+#ifdef QM_UI
+/// Displacements of the known cases alone, and of all with the factors found.
+EXIT_CODE DrawBeforeAfter(CDBDoc& doc, const T_ULF_RESULT& r, const std::string& path)
+{
+    T_SHOWN_CASE before{"known load cases alone", {}}, after{"with the factors found", {}};
+    for (std::size_t i = 0; i < r.cases.size(); ++i) {
+        if (!r.cases[i].unknown)
+            before.combination.items.push_back({false, r.cases[i].key, r.factors[i]});
+        after.combination.items.push_back({false, r.cases[i].key, r.factors[i]});
+    }
+    T_SHAPE shape = ShapeOfModel(doc);
+    shape.subtitle = "Unknown load factors: " + r.item.name;
+    for (const T_SHOWN_CASE& state : {before, after}) {
+        T_CASE_RESULTS results;
+        std::string error;
+        if (!ReadCaseResults(doc, state, results, error))
+            return Complain(EXIT_CODE::BadInput, doc.Path() + ": " + error);
+        shape.states.push_back(StateOf(state.name, results.displacements));
+    }
+    return WritePicture(ShapePlot(shape), path);
+}
+#endif
+
+EXIT_CODE DrawPictures(CDBDoc& doc, const T_ULF_RESULT& r, const T_ULF_OPTIONS& o)
+{
+#ifdef QM_UI
+    EXIT_CODE code = WritePicture(UlfPlot(UlfPictureOf({doc, r})), o.plot);
+    if (code == EXIT_CODE::Done && !o.shapePlot.empty())
+        code = DrawBeforeAfter(doc, r, o.shapePlot);
+    return code;
+#else
+    (void)doc, (void)r, (void)o;
+    return EXIT_CODE::Done;
+#endif
+}
+
+/// Shows how far a long search is, where somebody looks at it.
+bool ShowSearch(int tried, int members)
+{
+    std::fprintf(stderr, "\rqm-rps: looking for the contradiction, %d of %d%s", tried, members,
+                 tried == members ? "\n" : "");
+    std::fflush(stderr);
+    return true;
+}
+
+/// Today, or YYYY-MM-DD. False: the text is no date.
+bool SetDate(const std::string& text, T_ULF_SHEET_SETTINGS& settings)
+{
+    if (text.empty()) {
+        const std::time_t now = std::time(nullptr);
+        std::tm local{};
+        localtime_r(&now, &local);
+        settings.year = local.tm_year + 1900;
+        settings.month = local.tm_mon + 1;
+        settings.day = local.tm_mday;
+        return true;
+    }
+    char rest = 0;
+    return std::sscanf(text.c_str(), "%4d-%2d-%2d%c", &settings.year, &settings.month,
+                       &settings.day, &rest) == 3 &&
+           settings.month >= 1 && settings.month <= 12 && settings.day >= 1 && settings.day <= 31;
+}
+
+void ListItem(CDBDoc& doc, int key, const T_ULFI_D& item)
+{
+    const auto& combinations = doc.Data().Model().combinations;
+    const auto it = combinations.find(item.combination);
+    std::printf("%s: combination %s, %zu of %zu load cases unknown, %zu constraints%s\n",
+                item.name.c_str(), it == combinations.end() ? "-" : it->second.name.c_str(),
+                item.unknowns.size(), CUnknownLoadFactorItemDlg(doc, key).Cases().size(),
+                item.constraints.size(), item.solveByEquations ? ", solved as equations" : "");
+}
+
+void ListStageItem(const T_ULSI_D& item)
+{
+    const auto unknown = std::ranges::count_if(item.rows, &T_ULSI_ROW::unknown);
+    const auto scaling = std::ranges::count_if(item.rows, &T_ULSI_ROW::pretension);
+    std::printf("%s: construction stages, %td of %zu loads unknown (%td scale pretension), "
+                "%zu constraints%s\n",
+                item.name.c_str(), unknown, item.rows.size(), scaling, item.constraints.size(),
+                item.solveByEquations ? ", solved as equations" : "");
+}
+
+EXIT_CODE LastMessage(const zql::frx::MDialog& dialog, EXIT_CODE code, const std::string& file)
+{
+    const auto& messages = dialog.Messages();
+    return Complain(code, messages.empty() ? file + ": refused" : messages.back().text);
+}
+
+} // namespace
+
+EXIT_CODE RunUlfList(const T_ULF_OPTIONS& o)
+{
+    CDBDoc doc;
+    if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
+    const T_MODEL& model = doc.Data().Model();
+    for (const auto& [key, item] : model.ulfItems)
+        ListItem(doc, key, item);
+    for (const auto& entry : model.ulfStageItems)
+        ListStageItem(entry.second);
+    for (const auto& entry : model.ulfConstraints) {
+        T_ULFC_D c;
+        if (!doc.Attr().GetUlfc(entry.first, c)) continue;
+        const std::string place = UlfPlaceText(doc.Data(), c.stage, c.step);
+        std::printf("  %s: %s\n", UlfNameAt(c.name, place).c_str(), UlfDescription(c).c_str());
+    }
+    std::printf("%zu items, %zu constraints\n", model.ulfItems.size() + model.ulfStageItems.size(),
+                model.ulfConstraints.size());
+    return EXIT_CODE::Done;
+}
+
+EXIT_CODE RunUlfCheck(const T_ULF_OPTIONS& o)
+{
+    CDBDoc doc;
+    if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
+    std::size_t items = 0, findings = 0;
+    const auto check = [&](const std::string& name, const CUlfItemDialog& dialog) {
+        if (!o.item.empty() && name != o.item) return;
+        ++items;
+        for (const T_FINDING& f : dialog.Findings()) {
+            std::printf("%s: %s: %s\n", name.c_str(), f.field.c_str(), f.text.c_str());
+            ++findings;
+        }
+    };
+    for (const auto& [key, item] : doc.Data().Model().ulfItems)
+        check(item.name, CUnknownLoadFactorItemDlg(doc, key));
+    CUlfStageResults results(doc);
+    for (const auto& [key, item] : doc.Data().Model().ulfStageItems)
+        check(item.name, CUnknownStageItemDlg(doc, results, key));
+    if (items == 0 && !o.item.empty())
+        return Complain(EXIT_CODE::Usage,
+                        o.file + ": no unknown load factor item named \"" + o.item + "\"");
+    std::printf("%zu items, %zu findings\n", items, findings);
+    return findings == 0 ? EXIT_CODE::Done : EXIT_CODE::NotFound;
+}
+
+EXIT_CODE RunUlfSolve(const T_ULF_OPTIONS& o)
+{
+    for (const std::string& path : {o.plot, o.shapePlot}) {
+        if (const EXIT_CODE code = CheckPlotName(path); code != EXIT_CODE::Done) return code;
+    }
+    T_ULF_OPENED in;
+    if (const EXIT_CODE code = OpenItem(o, in); code != EXIT_CODE::Done) return code;
+    if (in.stage && !o.shapePlot.empty())
+        return Complain(EXIT_CODE::Usage, "--shape-plot draws static load cases; the loads of " +
+                                              o.item + " act at construction stages");
+    if (const EXIT_CODE code = AnalyseForUlf(o.file, in); code != EXIT_CODE::Done) return code;
+    const T_ULF_OUTCOME outcome = SolveUlf(*in.dialog);
+    const auto& result = in.dialog->Result();
+    if (outcome.code != EXIT_CODE::Done) Complain(outcome.code, o.file + ": " + outcome.message);
+    if (!o.json.empty()) {
+        const EXIT_CODE code = WriteOutput(o.json, UlfJson(outcome, result));
+        if (code != EXIT_CODE::Done) return code;
+    }
+    if (!result) return outcome.code;
+    if (o.json != "-") std::printf("%s", UlfTables(*result).c_str());
+    const EXIT_CODE drawn = DrawPictures(in.doc, *result, o);
+    return drawn == EXIT_CODE::Done ? outcome.code : drawn;
+}
+
+EXIT_CODE RunUlfExplain(const T_ULF_OPTIONS& o)
+{
+    T_ULF_OPENED in;
+    if (const EXIT_CODE code = OpenAndAnalyse(o, in); code != EXIT_CODE::Done) return code;
+    const T_ULF_OUTCOME outcome = SolveUlf(*in.dialog);
+    T_ULF_EXPLAINED explained;
+    const auto& run = in.dialog->LastRun();
+    const std::function<bool(int, int)> progress =
+        isatty(STDERR_FILENO) ? ShowSearch : std::function<bool(int, int)>();
+    if (!run || !ExplainUlf(*run, in.doc.Unit().Units(), explained, progress))
+        return Complain(outcome.code, o.file + ": " + outcome.message);
+    if (!o.json.empty()) {
+        const EXIT_CODE code = WriteOutput(o.json, ExplainJson(explained));
+        if (code != EXIT_CODE::Done) return code;
+    }
+    for (const std::string& line : explained.lines)
+        if (o.json != "-") std::printf("%s\n", line.c_str());
+    return outcome.code;
+}
+
+EXIT_CODE RunUlfExport(const T_ULF_OPTIONS& o)
+{
+    T_ULF_SHEET_SETTINGS settings;
+    settings.applicationVersion = o.sheetVersion;
+    settings.fileName = std::filesystem::path(o.file).filename().string();
+    if (!SetDate(o.date, settings))
+        return Complain(EXIT_CODE::Usage, o.date + ": a date is YYYY-MM-DD");
+    T_ULF_OPENED in;
+    if (const EXIT_CODE code = OpenAndAnalyse(o, in); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = SolveOpened(o, in); code != EXIT_CODE::Done) return code;
+    CUnknownLoadFactorResultDlg dialog(in.doc, *in.dialog->Result());
+    if (!dialog.OnExport(o.out, settings)) {
+        const bool fits = UlfSheetFits(dialog.Result().constraints.size(), o.sheetVersion);
+        return LastMessage(dialog, fits ? EXIT_CODE::NoAccess : EXIT_CODE::BadInput, o.file);
+    }
+    std::printf("%s written: %zu constraints, %zu load cases\n", o.out.c_str(),
+                dialog.Result().constraints.size(), dialog.Result().cases.size());
+    return EXIT_CODE::Done;
+}
+
+EXIT_CODE RunUlfCombine(const T_ULF_OPTIONS& o)
+{
+    T_ULF_OPENED in;
+    if (const EXIT_CODE code = OpenItem(o, in); code != EXIT_CODE::Done) return code;
+    if (in.stage)
+        return Complain(EXIT_CODE::Usage,
+                        o.file + ": " +
+                            MMSGFunction::Format("IDS_QM_ULSI_NO_COMBINATION", {o.item}));
+    if (o.out.empty() && !IsModelFile(o.file))
+        return Complain(EXIT_CODE::Usage, o.file + ": a case file is not changed; name another "
+                                                   "file with -o");
+    if (const EXIT_CODE code = AnalyseForUlf(o.file, in); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = SolveOpened(o, in); code != EXIT_CODE::Done) return code;
+    CUnknownLoadFactorResultDlg dialog(in.doc, *in.dialog->Result());
+    dialog.m_combinationName = o.name;
+    (void)TakeMessageHistory(); // what the calculation has left
+    const int made = dialog.OnMakeCombination();
+    const std::vector<std::string> history = TakeMessageHistory();
+    for (const std::string& line : history)
+        std::fprintf(made ? stdout : stderr, "%s%s\n", made ? "" : "qm-rps: ", line.c_str());
+    if (!made) return EXIT_CODE::Usage;
+    return SaveDocument(in.doc, o.out.empty() ? o.file : o.out);
+}

@@ -1,0 +1,225 @@
+#include "ulfrun.h"
+
+#include "analysecommands.h"
+#include "analysistext.h"
+#include "inputfile.h"
+#include "output.h"
+#include "qm_base/msgfunction.h"
+#include "qm_base/textformat.h"
+#include "qm_rps/factors/ulfchecks.h"
+#include "qm_rps/factors/ulfstageresults.h"
+#include "qm_rps/unknownloadfactoritemdlg.h"
+#include "qm_rps/unknownstageitemdlg.h"
+
+#include <algorithm>
+#include <array>
+#include <cmath>
+
+using zql::lib::MMSGFunction;
+
+namespace {
+
+/// Codes of the solver that say that there is no solution; others refuse the input.
+bool SaysNoSolution(int code)
+{
+    return code >= 5 && code <= 8;
+}
+
+std::string OneLine(std::string text)
+{
+    std::replace(text.begin(), text.end(), '\n', ' ');
+    return text;
+}
+
+std::string NumberOrNull(const std::optional<double>& v)
+{
+    return v ? ShortestText(*v + 0.0) : "null";
+}
+
+std::string Short(const std::optional<double>& v)
+{
+    return v ? FormatText("%.7g", *v + 0.0) : "-";
+}
+
+std::string FactorsJson(const T_ULF_RESULT& r)
+{
+    std::string text = "{";
+    for (std::size_t i = 0; i < r.cases.size(); ++i)
+        text += (i ? ",\n  " : "\n  ") + JsonText(r.cases[i].name) + ": " +
+                ShortestText(r.factors[i] + 0.0);
+    return text + "\n }";
+}
+
+std::string ConstraintsJson(const T_ULF_RESULT& r)
+{
+    std::string text = "[";
+    for (const T_ULF_RESULT_ROW& row : UlfResultRows(r))
+        text += (text.size() > 1 ? ",\n  {" : "\n  {") + ("\"name\": " + JsonText(row.name)) +
+                (row.place.empty() ? "" : ", \"place\": " + JsonText(row.place)) +
+                ", \"value\": " + ShortestText(row.value + 0.0) +
+                ", \"upper\": " + NumberOrNull(row.upper) +
+                ", \"lower\": " + NumberOrNull(row.lower) +
+                ", \"residual\": " + ShortestText(row.residual + 0.0) +
+                ", \"active\": " + (row.active ? "true" : "false") + "}";
+    return text + "\n ]";
+}
+
+/// [ ... ], one to a line.
+template <class T, class F>
+std::string List(const std::vector<T>& items, const F& print)
+{
+    std::string text = "[";
+    for (const T& item : items)
+        text += (text.size() > 1 ? ",\n  " : "\n  ") + print(item);
+    return text + (items.empty() ? "]" : "\n ]");
+}
+
+template <class ROWS, class F>
+int Widest(const ROWS& rows, int least, const F& text)
+{
+    std::size_t width = static_cast<std::size_t>(least);
+    for (const auto& row : rows)
+        width = std::max(width, text(row).size());
+    return static_cast<int>(width);
+}
+
+} // namespace
+
+T_ULF_OPENED::T_ULF_OPENED() = default;
+T_ULF_OPENED::~T_ULF_OPENED() = default;
+
+EXIT_CODE OpenUlfItem(const std::string& file, const std::string& item, bool sumStageLoads,
+                      T_ULF_OPENED& out)
+{
+    if (const EXIT_CODE code = OpenInput(out.doc, file); code != EXIT_CODE::Done) return code;
+    int key = 0, stageKey = 0;
+    const bool isStatic = out.doc.Attr().FindUlfi(item, key) != 0;
+    out.stage = out.doc.Attr().FindUlsi(item, stageKey) != 0;
+    const std::string quoted = "\"" + item + "\"";
+    if (isStatic && out.stage)
+        return Complain(EXIT_CODE::BadInput,
+                        file + ": " + quoted +
+                            " names a static item and one of construction stages; give one of "
+                            "them another name");
+    if (out.stage) {
+        out.results = std::make_unique<CUlfStageResults>(out.doc);
+        auto dialog = std::make_unique<CUnknownStageItemDlg>(out.doc, *out.results, stageKey);
+        dialog->m_sumStageLoads = sumStageLoads;
+        out.dialog = std::move(dialog);
+    } else if (isStatic) {
+        auto dialog = std::make_unique<CUnknownLoadFactorItemDlg>(out.doc, key);
+        for (const T_ULF_CASE& loadCase : dialog->Cases())
+            out.cases.push_back(loadCase.key);
+        out.dialog = std::move(dialog);
+    } else {
+        return Complain(EXIT_CODE::Usage, file + ": no unknown load factor item named " + quoted);
+    }
+    return EXIT_CODE::Done;
+}
+
+EXIT_CODE AnalyseForUlf(const std::string& file, T_ULF_OPENED& in)
+{
+    if ((!in.stage && IsModelFile(file)) || !in.dialog->Findings().empty()) return EXIT_CODE::Done;
+    return in.stage ? AnalyseStages(in.doc, file) : Analyse(in.doc, in.cases, 0);
+}
+
+EXIT_CODE AnalyseStages(CDBDoc& doc, const std::string& file)
+{
+    if (doc.Post().CheckStagedResult()) return EXIT_CODE::Done;
+    T_ANALYSIS_OPTIONS options;
+    options.allCases = false;
+    T_ANALYSIS_ERROR error;
+    if (doc.RunAnalysis(options, error)) return EXIT_CODE::Done;
+    return Complain(EXIT_CODE::BadInput, file + ": " + error.text);
+}
+
+T_ULF_OUTCOME SolveUlf(CUlfItemDialog& dialog)
+{
+    T_ULF_OUTCOME out;
+    const bool solved = dialog.OnCalculate();
+    const auto& run = dialog.LastRun();
+    if (run) out.solverCode = run->answer.code;
+    out.exact = dialog.m_solveByEquations || (run && run->answer.exact);
+    if (!dialog.Messages().empty()) out.message = OneLine(dialog.Messages().back().text);
+    if (solved) {
+        out.exact = dialog.Result()->exact;
+        const auto rows = UlfResultRows(*dialog.Result());
+        const bool met = std::ranges::all_of(rows, &T_ULF_RESULT_ROW::met);
+        out.status = met ? "found" : "not met";
+        out.code = met ? EXIT_CODE::Done : EXIT_CODE::NotFound;
+        if (out.message.empty())
+            out.message = MMSGFunction::GetValue("IDS_RPS_Unknown_CAN_FIND_OPTIMIZED_SOLUTION");
+        return out;
+    }
+    // A numbered constraint or factor: the restriction of the signs leaves nothing.
+    const bool none = run && (SaysNoSolution(out.solverCode) || run->answer.constraint > 0 ||
+                              run->answer.factor > 0);
+    out.status = none ? "not found" : "refused";
+    out.code = none ? EXIT_CODE::NotFound : EXIT_CODE::BadInput;
+    return out;
+}
+
+std::string UlfJson(const T_ULF_OUTCOME& o, const std::optional<T_ULF_RESULT>& r)
+{
+    return "{\n \"status\": " + JsonText(o.status) +
+           ",\n \"code\": " + std::to_string(o.solverCode) +
+           ",\n \"message\": " + JsonText(o.message) +
+           ",\n \"mode\": " + (o.exact ? "\"[EXACT]\"" : "\"[OPTIMIZE]\"") +
+           ",\n \"factors\": " + (r ? FactorsJson(*r) : "{}") +
+           ",\n \"constraints\": " + (r ? ConstraintsJson(*r) : "[]") +
+           ",\n \"objective\": " + (r ? ShortestText(UlfObjective(*r)) : "null") + "\n}\n";
+}
+
+std::string ExplainJson(const T_ULF_EXPLAINED& e)
+{
+    const auto limit = [](const auto& h) {
+        static constexpr std::array<const char*, 4> kNames{"target", "upper", "lower", "sign"};
+        return "{\"name\": " + JsonText(h.name) + ", \"limit\": \"" +
+               kNames[static_cast<std::size_t>(h.limit)] +
+               "\", \"value\": " + ShortestText(h.value + 0.0) + ", \"unit\": " + JsonText(h.unit);
+    };
+    const std::string tail = ",\n \"compromise\": ";
+    std::string text =
+        FormatText("{\n \"solved\": %s,\n \"unknowns\": %d,\n \"rows\": %d,\n \"rank\": %d,\n ",
+                   e.solved ? "true" : "false", e.unknowns, e.rows, e.rank) +
+        "\"condition\": " + ShortestText(e.condition) +
+        ",\n \"unfelt\": " + List(e.unfelt, JsonText) +
+        ",\n \"objective\": " + (e.solved ? ShortestText(e.objective + 0.0) : "null") +
+        ",\n \"held\": " +
+        List(e.held,
+             [&](const T_ULF_HOLD& h) {
+                 return limit(h) + ", \"multiplier\": " + ShortestText(h.multiplier + 0.0) + "}";
+             }) +
+        ",\n \"conflict\": " +
+        List(e.conflict, [&](const T_ULF_CLASH& c) { return limit(c) + "}"; }) +
+        ",\n \"conflict_with_sign\": " + (e.conflictWithSign ? "true" : "false") + tail;
+    text += e.compromise ? "{\n \"factors\": " + FactorsJson(*e.compromise) +
+                               ",\n \"constraints\": " + ConstraintsJson(*e.compromise) + "\n }"
+                         : "null";
+    return text + ",\n \"lines\": " + List(e.lines, JsonText) + "\n}\n";
+}
+
+std::string UlfTables(const T_ULF_RESULT& r)
+{
+    const int caseWidth =
+        Widest(r.cases, r.stage ? 15 : 10, [](const T_ULF_CASE& c) { return c.name; });
+    std::string text = FormatText("%-*s %9s %16s\n", caseWidth,
+                                  r.stage ? "stage/step case" : "load case", "", "factor");
+    for (std::size_t i = 0; i < r.cases.size(); ++i)
+        text += FormatText("%-*s %9s %16.9g\n", caseWidth, r.cases[i].name.c_str(),
+                           r.cases[i].unknown ? "unknown" : "known", r.factors[i] + 0.0);
+    const auto rows = UlfResultRows(r);
+    const auto nameOf = [](const T_ULF_RESULT_ROW& row) { return UlfNameAt(row.name, row.place); };
+    const int width = Widest(rows, 10, nameOf);
+    text += FormatText("\n%-*s %15s %15s %15s %13s  %s\n", width, "constraint", "value", "lower",
+                       "upper", "missed by", "state");
+    for (std::size_t i = 0; i < rows.size(); ++i) {
+        const T_ULF_RESULT_ROW& row = rows[i];
+        const double scale = UlfScale(r, i);
+        const char* const state = !row.met ? "not met" : row.active ? "active" : "-";
+        text += FormatText("%-*s %15.7g %15s %15s %13.3g  %s\n", width, nameOf(row).c_str(),
+                           UlfShown(row.value, scale), Short(row.lower).c_str(),
+                           Short(row.upper).c_str(), UlfShown(row.residual, scale), state);
+    }
+    return text + FormatText("\nobjective %.9g\n", UlfObjective(r));
+}

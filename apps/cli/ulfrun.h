@@ -1,0 +1,58 @@
+// A solved (or refused) unknown load factor item, and its text forms.
+#pragma once
+
+#include "exitcodes.h"
+#include "qm_rps/factors/ulfexplain.h"
+#include "qm_rps/ulfitemdialog.h"
+
+#include <memory>
+
+#include <string>
+
+/// What a run gave.
+struct T_ULF_OUTCOME {
+    EXIT_CODE code = EXIT_CODE::Done; // NotFound: no solution, or a constraint is not met
+    std::string status;               // "found", "not met", "not found", "refused"
+    std::string message;              // one line
+    int solverCode = 0;
+    bool exact = false;
+};
+
+class IUlfStageResults;
+
+/// A document with one of its items, ready to be calculated.
+struct T_ULF_OPENED {
+    T_ULF_OPENED();
+    ~T_ULF_OPENED();
+    T_ULF_OPENED(const T_ULF_OPENED&) = delete;
+    T_ULF_OPENED& operator=(const T_ULF_OPENED&) = delete;
+
+    CDBDoc doc;
+    bool stage = false;                        // the item is one of construction stages
+    std::unique_ptr<IUlfStageResults> results; // of such an item
+    std::unique_ptr<CUlfItemDialog> dialog;
+    std::vector<int> cases; // keys of the load cases of a static item
+};
+
+/// Opens the file and finds the item by its name, static or of construction stages. Done, or the
+/// code to exit with after one line on stderr: also for a name that both kinds of item have.
+EXIT_CODE OpenUlfItem(const std::string& file, const std::string& item, bool sumStageLoads,
+                      T_ULF_OPENED& out);
+
+/// Analyses in memory what the item reads: for a static item of a case file the load cases of its
+/// combination, for one of stages the stages, which no file keeps. An item with findings is left
+/// to its calculation, which refuses it. Done, or as above.
+EXIT_CODE AnalyseForUlf(const std::string& file, T_ULF_OPENED& in);
+
+/// Analyses the construction stages unless they have current results.
+EXIT_CODE AnalyseStages(CDBDoc& doc, const std::string& file);
+
+/// Calculates and names the outcome.
+T_ULF_OUTCOME SolveUlf(CUlfItemDialog& dialog);
+
+/// {"status", "code", "message", "mode", "factors", "constraints", "objective"}.
+std::string UlfJson(const T_ULF_OUTCOME& outcome, const std::optional<T_ULF_RESULT>& result);
+/// What holds the solution, or what contradicts, with the words of ExplainUlf in "lines".
+std::string ExplainJson(const T_ULF_EXPLAINED& explained);
+/// Tables of the factors and of the constraints.
+std::string UlfTables(const T_ULF_RESULT& result);

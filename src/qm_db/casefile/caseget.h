@@ -1,0 +1,344 @@
+// Visitor of CaseFields: reads the members of one object of a case file into a record in SI.
+#pragma once
+
+#include "qm_db/casefile/jsonreader.h"
+#include "qm_db/records/hingefields.h"
+#include "qm_db/records/stagefields.h"
+
+#include <cmath>
+#include <type_traits>
+
+class CCaseGet {
+public:
+    template <class T>
+    using Ref = T&;
+    static constexpr bool kReads = true;
+    static constexpr bool kWrites = false;
+
+    /// `more`: keys of the object that the record's fields do not have. `names`: of a case file;
+    /// without them (in the model file) references are keys and nothing is checked.
+    CCaseGet(CJsonReader& in, const T_UNITS& units,
+             std::initializer_list<std::string_view> more = {}, const CCaseNames* names = nullptr)
+        : m_in(in), m_units(units), m_names(names), m_keys(more)
+    {
+    }
+
+    /// Reads a whole object; other keys and missing members are faults.
+    template <class R, class... C>
+    static void Record(CJsonReader& in, const T_UNITS& units,
+                       std::initializer_list<std::string_view> more, R& r, const C&... context)
+    {
+        CCaseGet get(in, units, more);
+        CaseFields(get, r, context...);
+        get.Finish();
+    }
+    /// The same in a case file.
+    template <class R>
+    static void Record(CJsonReader& in, const T_UNITS& units, const CCaseNames& names,
+                       std::initializer_list<std::string_view> more, R& r)
+    {
+        CCaseGet get(in, units, more, &names);
+        CaseFields(get, r);
+        get.Finish();
+    }
+    /// For a caller that calls the fields itself: judges the keys.
+    void Finish()
+    {
+        m_in.Keys(std::span<const std::string_view>(m_keys));
+        if (m_missing) (void)m_in.Member(m_missing);
+    }
+
+    /// The key is known, whether it is there or not.
+    bool Has(const char* key)
+    {
+        m_keys.emplace_back(key);
+        return m_in.Has(key);
+    }
+
+    /// A fault at once when the member is missing.
+    void Must(const char* key)
+    {
+        if (!m_in.Has(key)) (void)m_in.Member(key);
+    }
+
+    template <class T>
+    void Need(const char* key, T& out, T_DIM dim = kDimNone)
+    {
+        if (!Take(key)) return;
+        CJsonReader member = m_in.Member(key);
+        Read(member, out, dim);
+    }
+    template <class T>
+    void Opt(const char* key, T& out, const T& missing, T_DIM dim = kDimNone)
+    {
+        if (!Has(key)) {
+            out = missing;
+            return;
+        }
+        CJsonReader member = m_in.Member(key);
+        Read(member, out, dim);
+    }
+    /// Returns the key that is there, `key` when neither is.
+    const char* OptOr(const char* key, const char* old, double& out, double missing, T_DIM dim)
+    {
+        const bool older = old && Has(old);
+        if (older && Has(key))
+            m_in.FailAt(key, std::string("the same as \"") + old + "\", which is there too");
+        Opt(older ? old : key, out, missing, dim);
+        return older ? old : key;
+    }
+    template <class T>
+    void OptIf(const char* key, std::optional<T>& out, T_DIM dim = kDimNone)
+    {
+        if (Has(key)) Need(key, out.emplace(), dim);
+    }
+    template <std::size_t N>
+    void NeedFixed(const char* key, std::array<double, N>& out, const std::array<T_DIM, N>& dims)
+    {
+        if (!Take(key)) return;
+        CJsonReader member = m_in.Member(key);
+        member.Read(out);
+        for (std::size_t i = 0; i < N && !member.Failed(); ++i)
+            Convert(member, out[i], SiFactor(m_units, dims[i]));
+    }
+    template <std::size_t N>
+    void OptFixed(const char* key, std::array<double, N>& out, const std::array<double, N>& missing,
+                  const std::array<T_DIM, N>& dims)
+    {
+        out = missing;
+        if (Has(key)) NeedFixed(key, out, dims);
+    }
+    template <std::size_t N>
+    void Flags(const char* key, std::array<bool, N>& out, const std::array<const char*, N>& names,
+               const char* what)
+    {
+        out = {};
+        if (!Has(key)) return;
+        m_in.Member(key).ForEachItem([&](CJsonReader& item, std::size_t) {
+            out[static_cast<std::size_t>(item.Choice(names, what))] = true;
+        });
+    }
+    void Texts(const char* key, std::vector<std::string>& out)
+    {
+        if (!Has(key)) return;
+        m_in.Member(key).ForEachItem(
+            [&](CJsonReader& item, std::size_t) { item.Read(out.emplace_back()); });
+    }
+    /// 0 when it is left out.
+    void OptRef(const char* key, int& out, CASE_REF kind)
+    {
+        out = 0;
+        if (Has(key)) NeedRef(key, out, kind);
+    }
+    void NeedRef(const char* key, int& out, CASE_REF kind)
+    {
+        if (!Take(key)) return;
+        CJsonReader member = m_in.Member(key);
+        const bool byKey = kind == CASE_REF::Material || kind == CASE_REF::Section;
+        if (!m_names || (byKey && !member.IsText())) {
+            member.Read(out);
+            if (m_names && out != 0 && !m_names->HasKey(kind, out)) FailRef(member, kind);
+            return;
+        }
+        std::string name;
+        member.Read(name);
+        const std::optional<int> found = m_names->KeyOf(kind, name);
+        if (!found) FailRef(member, kind);
+        out = found.value_or(0);
+    }
+    void Node(const char* key, int& id)
+    {
+        Need(key, id);
+        if (m_names) m_in.Check(key, m_names->HasNode(id), "there is no such node");
+    }
+    void Element(const char* key, int& id)
+    {
+        Need(key, id);
+        if (m_names) m_in.Check(key, m_names->HasElement(id), "there is no such element");
+    }
+    void NodeList(const char* key, std::vector<int>& ids)
+    {
+        Need(key, ids);
+        CheckIds(
+            key, ids, [&](int id) { return m_names->HasNode(id); }, "there is no such node",
+            "the node appears twice");
+    }
+    void OptNodes(const char* key, std::vector<int>& ids)
+    {
+        ids.clear();
+        if (Has(key)) NodeList(key, ids);
+    }
+    void OptElements(const char* key, std::vector<int>& ids)
+    {
+        ids.clear();
+        if (!Has(key)) return;
+        Need(key, ids);
+        CheckIds(
+            key, ids, [&](int id) { return m_names->HasElement(id); }, "there is no such element",
+            "the element appears twice");
+    }
+    /// "first", "last" or a number from 1.
+    void StageStep(const char* key, int& step, int missing)
+    {
+        step = missing;
+        if (!Has(key)) return;
+        CJsonReader member = m_in.Member(key);
+        if (member.IsText()) {
+            step = member.Choice(kStageStepNames, "step") == 0 ? kStageFirstStep : kStageLastStep;
+            return;
+        }
+        member.Read(step);
+        if (step < kStageFirstStep) member.Fail("steps count from 1");
+    }
+    /// A fault of a case file unless `ok`; a member that is left out is not judged.
+    void Check(const char* key, bool ok, const char* reason)
+    {
+        if (m_names) m_in.Check(key, ok, reason);
+    }
+    template <class R, class F>
+    void CheckEach(const char* key, const R& values, F ok, const char* reason)
+    {
+        if (m_names && m_in.Has(key)) m_in.CheckEach(key, values, ok, reason);
+    }
+    /// A fault of the member, or of the whole object, in every file.
+    void Rule(const char* key, bool ok, const char* reason)
+    {
+        if (ok || (key && !m_in.Has(key))) return;
+        if (key)
+            m_in.FailAt(key, reason);
+        else
+            m_in.Fail(reason);
+    }
+    template <class E>
+    void Enum(const char* key, E& out, std::span<const char* const> names, const char* what)
+    {
+        if (Take(key)) out = static_cast<E>(m_in.Choice(key, names, what));
+    }
+    template <int kFirst = 0, class E>
+    void EnumOpt(const char* key, E& out, E missing, std::span<const char* const> names,
+                 const char* what)
+    {
+        out = missing;
+        if (Has(key)) out = static_cast<E>(kFirst + m_in.Choice(key, names, what));
+    }
+    template <class E>
+    void Code(const char* key, E& out, std::span<const char* const> names, const char* what)
+    {
+        if (!Take(key)) return;
+        int code = 0;
+        if (m_in.Member(key).IsText())
+            code = m_in.Choice(key, names, what);
+        else
+            m_in.Get(key, code);
+        out = static_cast<E>(code);
+    }
+    template <class R, class... C>
+    void Part(const char* key, R& r, const C&... context)
+    {
+        if (!Has(key)) return;
+        CJsonReader member = m_in.Member(key);
+        Nested(member, r, context...);
+    }
+    template <class R, class... C>
+    void NeedPart(const char* key, R& r, const C&... context)
+    {
+        if (!Take(key)) return;
+        CJsonReader member = m_in.Member(key);
+        Nested(member, r, context...);
+    }
+    template <class R, class... C>
+    void PartIf(const char* key, std::optional<R>& r, const C&... context)
+    {
+        if (m_in.Has(key)) r.emplace();
+        if (r) return Part(key, *r, context...);
+        m_keys.emplace_back(key);
+    }
+    template <class R, class... C>
+    void List(const char* key, std::vector<R>& all, const C&... context)
+    {
+        if (!Has(key)) return;
+        m_in.Member(key).ForEachItem(
+            [&](CJsonReader& item, std::size_t) { Nested(item, all.emplace_back(), context...); });
+    }
+    /// Up to N numbers; the rest is 0.
+    template <std::size_t N>
+    void Padded(const char* key, std::array<double, N>& out, T_DIM dim)
+    {
+        std::vector<double> values;
+        if (!Has(key)) return;
+        CJsonReader member = m_in.Member(key);
+        Read(member, values, dim);
+        if (values.size() > N)
+            return member.Fail(std::to_string(values.size()) + " values, expected up to " +
+                               std::to_string(N));
+        std::copy(values.begin(), values.end(), out.begin());
+    }
+    /// {"p": [...], "m": [...]}, N ratios each.
+    template <std::size_t N>
+    void Pairs(const char* key, std::array<T_PM_POINT, N>& out)
+    {
+        if (!Has(key)) return;
+        std::array<double, N> p{}, m{};
+        CJsonReader member = m_in.Member(key);
+        member.Keys({"p", "m"});
+        member.Get("p", p);
+        member.Get("m", m);
+        for (std::size_t i = 0; i < N; ++i)
+            out[i] = {p[i], m[i]};
+    }
+
+private:
+    template <class R, class... C>
+    void Nested(CJsonReader& in, R& r, const C&... context)
+    {
+        CCaseGet get(in, m_units, {}, m_names);
+        CaseFields(get, r, context...);
+        get.Finish();
+    }
+    template <class F>
+    void CheckIds(const char* key, const std::vector<int>& ids, F exists, const char* missing,
+                  const char* twice)
+    {
+        if (!m_names || !m_in.Has(key)) return;
+        std::set<int> seen;
+        m_in.CheckEach(key, ids, exists, missing);
+        m_in.CheckEach(
+            key, ids, [&](int id) { return seen.insert(id).second; }, twice);
+    }
+    static void FailRef(CJsonReader& in, CASE_REF kind)
+    {
+        in.Fail(std::string("there is no such ") + kCaseRefNames[static_cast<std::size_t>(kind)]);
+    }
+
+    /// A missing member becomes a fault at the end: a wrong spelling is told first.
+    bool Take(const char* key)
+    {
+        if (Has(key)) return true;
+        if (!m_missing) m_missing = key;
+        return false;
+    }
+
+    template <class T>
+    void Read(CJsonReader& in, T& out, T_DIM dim) const
+    {
+        in.Read(out);
+        if (dim == kDimNone || in.Failed()) return;
+        const double factor = SiFactor(m_units, dim);
+        if constexpr (std::is_same_v<T, double>)
+            Convert(in, out, factor);
+        else if constexpr (std::is_same_v<T, std::vector<double>>)
+            for (double& value : out)
+                Convert(in, value, factor);
+    }
+    static void Convert(CJsonReader& in, double& value, double factor)
+    {
+        value *= factor;
+        if (!std::isfinite(value)) in.Fail("a value is too large");
+    }
+
+    CJsonReader& m_in;
+    const T_UNITS& m_units;
+    const CCaseNames* m_names; // null in the model file
+    std::vector<std::string_view> m_keys;
+    const char* m_missing = nullptr;
+};

@@ -1,0 +1,51 @@
+// Reads the parsed document of a case file into a model. The parts are called in this order, each
+// refers only to records read before. A fault is kept by the reader; the model is then incomplete.
+#pragma once
+
+#include "qm_db/casefile/jsonreader.h"
+#include "qm_db/modelstore.h"
+#include "qm_db/records/recordunits.h"
+
+#include <cmath>
+
+/// The whole document. `folder` is where relative paths of recorder files start.
+void ReadCase(CJsonReader& root, const std::string& folder, T_MODEL_CONTENT& content);
+
+/// Design codes, hinge options, and the tables from the materials to the unknown load factor items.
+void ReadStructTables(CJsonReader& root, T_MODEL& model);
+/// Increment functions, hinge types and hinges.
+void ReadHingeTables(CJsonReader& root, T_MODEL& model);
+void ReadSpectra(CJsonReader& root, T_MODEL& model);
+void ReadPushovers(CJsonReader& root, const std::string& folder, T_MODEL_CONTENT& content);
+void ReadEvaluations(CJsonReader& root, T_MODEL& model);
+
+/// "steps" of one load case, in SI.
+void ReadSteps(CJsonReader& steps, const std::string& folder, const T_MODEL& model,
+               const T_POLC_D& push, T_PUSH_DATA& out);
+
+/// Calls f(CJsonReader& item, index) for each item of a table that may be left out.
+template <class F>
+void ForEachRecord(CJsonReader& root, std::string_view key, F&& f)
+{
+    if (root.Has(key)) root.Member(key).ForEachItem(f);
+}
+
+/// The record to SI; a fault when a value leaves the range of a double.
+template <class T>
+void RecordToSiChecked(CJsonReader& in, T& record, const T_UNITS& units)
+{
+    RecordToSi(record, units);
+    ForEachQuantity(record, [&](double& v, T_DIM) {
+        if (!std::isfinite(v)) in.Fail("a value is too large");
+    });
+}
+
+// Rules for numbers, for Check and its relatives.
+inline bool IsAboveZero(double v)
+{
+    return v > 0.0;
+}
+inline bool IsZeroOrAbove(double v)
+{
+    return v >= 0.0;
+}

@@ -1,0 +1,174 @@
+#include "qm_db/casefile/jsonreader.h"
+
+#include "qm_base/textformat.h"
+
+#include <algorithm>
+#include <charconv>
+#include <cmath>
+#include <limits>
+
+namespace {
+
+// In the order of the variant in T_JSON.
+constexpr std::array<const char*, 7> kKindNames{"null",     "true or false", "a number", "a text",
+                                                "an array", "an array",      "an object"};
+
+bool IsInt(double value)
+{
+    return std::fabs(value) <= std::numeric_limits<int>::max() && value == std::floor(value);
+}
+
+bool HasControl(const std::string& text)
+{
+    return std::any_of(text.begin(), text.end(),
+                       [](char c) { return static_cast<unsigned char>(c) < 0x20 || c == 0x7f; });
+}
+
+std::string Joined(std::span<const char* const> names)
+{
+    std::string all;
+    for (const char* name : names)
+        all += (all.empty() ? "" : ", ") + std::string(name);
+    return all;
+}
+
+} // namespace
+
+void CJsonReader::Fail(const std::string& reason, FILE_FAULT fault)
+{
+    if (!Failed()) *m_error = {fault, m_place.empty() ? reason : m_place + ": " + reason};
+}
+
+void CJsonReader::FailAt(std::string_view key, const std::string& reason)
+{
+    if (!Failed()) CJsonReader(nullptr, MemberPlace(m_place, key), *m_error).Fail(reason);
+}
+
+void CJsonReader::FailAtItem(std::string_view key, std::size_t index, const char* reason)
+{
+    if (Failed()) return;
+    CJsonReader(nullptr, ItemPlace(MemberPlace(m_place, key), index), *m_error).Fail(reason);
+}
+
+void CJsonReader::FailType(const char* expected)
+{
+    const std::size_t kind = m_value ? m_value->data.index() : 0;
+    Fail(FormatText("expected %s, found %s", expected, kKindNames[kind]));
+}
+
+void CJsonReader::FailCount(std::size_t found, std::size_t expected)
+{
+    Fail(FormatText("%zu values, expected %zu", found, expected));
+}
+
+void CJsonReader::Check(std::string_view key, bool ok, const char* reason)
+{
+    if (!ok && Has(key)) FailAt(key, reason);
+}
+
+T_JSON* CJsonReader::Find(std::string_view key) const
+{
+    auto* members = m_value ? std::get_if<T_JSON_MEMBERS>(&m_value->data) : nullptr;
+    if (!members) return nullptr;
+    for (T_JSON_MEMBER& member : *members) {
+        if (member.key == key) return &member.value;
+    }
+    return nullptr;
+}
+
+void CJsonReader::Keys(std::span<const std::string_view> known)
+{
+    const auto* members = m_value ? std::get_if<T_JSON_MEMBERS>(&m_value->data) : nullptr;
+    if (!members) return FailType("an object");
+    for (const T_JSON_MEMBER& member : *members) {
+        if (std::find(known.begin(), known.end(), member.key) == known.end())
+            return Fail("unknown key " + QuotedText(member.key));
+    }
+}
+
+CJsonReader CJsonReader::Member(std::string_view key)
+{
+    T_JSON* value = Find(key);
+    if (!value) Fail(QuotedText(key) + " is missing");
+    return {value, MemberPlace(m_place, key), *m_error};
+}
+
+void CJsonReader::GetName(std::string_view key, std::string& out, std::set<std::string>& taken)
+{
+    Get(key, out);
+    Check(key, !out.empty(), "a name can't be empty");
+    Check(key, !HasControl(out), "a name can't have control characters");
+    if (!taken.insert(out).second) FailAt(key, QuotedText(out) + " appears twice");
+}
+
+int CJsonReader::Choice(std::span<const char* const> names, const char* what)
+{
+    std::string text;
+    Read(text);
+    const auto it = std::find(names.begin(), names.end(), text);
+    if (it != names.end()) return static_cast<int>(it - names.begin());
+    Fail("unknown " + std::string(what) + ' ' + QuotedText(text) + "; allowed: " + Joined(names));
+    return 0;
+}
+
+void CJsonReader::Read(double& out)
+{
+    if (Failed()) return;
+    const auto* number = m_value ? std::get_if<double>(&m_value->data) : nullptr;
+    if (!number) return FailType("a number");
+    out = *number;
+}
+
+void CJsonReader::Read(int& out)
+{
+    double number = 0.0;
+    Read(number);
+    if (Failed()) return;
+    if (!IsInt(number)) return Fail(ShortestText(number) + " is not an integer");
+    out = static_cast<int>(number);
+}
+
+void CJsonReader::Read(bool& out)
+{
+    if (Failed()) return;
+    const auto* flag = m_value ? std::get_if<bool>(&m_value->data) : nullptr;
+    if (!flag) return FailType("true or false");
+    out = *flag;
+}
+
+void CJsonReader::Read(std::string& out)
+{
+    if (Failed()) return;
+    const auto* text = m_value ? std::get_if<std::string>(&m_value->data) : nullptr;
+    if (!text) return FailType("a text");
+    out = *text;
+}
+
+void CJsonReader::Read(std::vector<double>& out)
+{
+    if (Failed()) return;
+    auto* numbers = m_value ? std::get_if<T_JSON_NUMBERS>(&m_value->data) : nullptr;
+    if (numbers) {
+        out = std::move(*numbers);
+        return;
+    }
+    double number = 0.0; // a mixed array: the first item that is no number makes the fault
+    ForEachItem([&](CJsonReader& item, std::size_t) { item.Read(number); });
+}
+
+void CJsonReader::Read(std::vector<int>& out)
+{
+    std::vector<int> values;
+    ForEachItem([&](CJsonReader& item, std::size_t) { item.Read(values.emplace_back()); });
+    if (!Failed()) out = std::move(values);
+}
+
+int CJsonReader::NodeIdOf(const std::string& key)
+{
+    int node = 0;
+    const char* const end = key.data() + key.size();
+    const auto [stop, fault] = std::from_chars(key.data(), end, node);
+    if (fault != std::errc{} || stop != end || node <= 0 || key.front() == '0')
+        Fail("the key must be a node id");
+    return node;
+}

@@ -1,0 +1,202 @@
+#include "qm_db/store/modelschema.h"
+
+#include "qm_base/msgfunction.h"
+#include "qm_db/file/storefault.h"
+#include "qm_db/store/sqlitedb.h"
+#include "qm_db/store/sqlitestmt.h"
+
+#include <algorithm>
+#include <vector>
+
+namespace {
+
+// Tables that came with version 2. Nested records are text: "body" is the record's object in the
+// case file, in SI, without its key and name. Elements and generated hinges are in "arrays".
+constexpr const char* kMaterials =
+    "CREATE TABLE materials(key INTEGER PRIMARY KEY, name TEXT NOT NULL, body TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT";
+constexpr const char* kSections =
+    "CREATE TABLE sections(key INTEGER PRIMARY KEY, name TEXT NOT NULL, body TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT";
+constexpr const char* kHingeTypes =
+    "CREATE TABLE hinge_types(key INTEGER PRIMARY KEY, name TEXT NOT NULL, body TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT";
+constexpr const char* kInelasticHinges =
+    "CREATE TABLE inelastic_hinges(key INTEGER PRIMARY KEY, name TEXT NOT NULL, "
+    "body TEXT NOT NULL, negative_zeros INTEGER NOT NULL) STRICT";
+constexpr const char* kIncrementFunctions =
+    "CREATE TABLE increment_functions(key INTEGER PRIMARY KEY, name TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT";
+
+// Tables that came with version 3.
+constexpr const char* kVersion3[] = {
+    "CREATE TABLE diaphragms(key INTEGER PRIMARY KEY, body TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+    "CREATE TABLE equal_displacements(key INTEGER PRIMARY KEY, body TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+    "CREATE TABLE load_cases(key INTEGER PRIMARY KEY, name TEXT NOT NULL, body TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+    "CREATE TABLE combinations(key INTEGER PRIMARY KEY, name TEXT NOT NULL, body TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+    "CREATE TABLE ulf_constraints(key INTEGER PRIMARY KEY, name TEXT NOT NULL, "
+    "body TEXT NOT NULL, negative_zeros INTEGER NOT NULL) STRICT",
+    "CREATE TABLE ulf_items(key INTEGER PRIMARY KEY, name TEXT NOT NULL, body TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+    "CREATE TABLE static_results(key INTEGER PRIMARY KEY, nodes INTEGER NOT NULL, "
+    "elements INTEGER NOT NULL, fingerprint INTEGER NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT"};
+
+// Tables that came with version 4.
+constexpr const char* kVersion4[] = {
+    "CREATE TABLE stages(key INTEGER PRIMARY KEY, name TEXT NOT NULL, body TEXT NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+    "CREATE TABLE ulf_stage_items(key INTEGER PRIMARY KEY, name TEXT NOT NULL, "
+    "body TEXT NOT NULL, negative_zeros INTEGER NOT NULL) STRICT",
+    "CREATE TABLE staged_results(key INTEGER PRIMARY KEY, stage INTEGER NOT NULL, "
+    "step INTEGER NOT NULL, load_case INTEGER NOT NULL, load_group INTEGER NOT NULL, "
+    "nodes INTEGER NOT NULL, elements INTEGER NOT NULL, fingerprint INTEGER NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT"};
+
+// Scalars are typed columns, quantities in SI. Bit i of negative_zeros says that the i-th column
+// of the row is -0.0: a REAL column stores a whole number as an integer, which has no such value.
+// Every list of numbers (node ids, coordinates, mode shapes, spectrum tables) is a row of "arrays":
+// `count` numbers of `width` bytes, 'i' integers or 'f' IEEE floating point numbers, packed.
+// A change here is a new schema version and a migration.
+constexpr const char* kTables[] = {
+    "CREATE TABLE model(key INTEGER PRIMARY KEY, title TEXT NOT NULL, force_unit TEXT NOT NULL, "
+    "length_unit TEXT NOT NULL, gravity REAL, negative_zeros INTEGER NOT NULL, "
+    "concrete_code TEXT, steel_code TEXT, alternative_hysteresis INTEGER NOT NULL, "
+    "wall_strength_degradation INTEGER NOT NULL, gsd INTEGER NOT NULL, plane INTEGER, body TEXT) "
+    "STRICT",
+
+    "CREATE TABLE storeys(key INTEGER PRIMARY KEY, name TEXT NOT NULL, height REAL NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+
+    "CREATE TABLE modes(key INTEGER PRIMARY KEY, period REAL NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+
+    "CREATE TABLE spectra(key INTEGER PRIMARY KEY, name TEXT NOT NULL, kind TEXT NOT NULL, "
+    "Ca REAL, Cv REAL, floors INTEGER, type INTEGER, soil TEXT, topography INTEGER, ag REAL, "
+    "damping REAL, S REAL, TB REAL, TC REAL, TD REAL, "
+    "SLO_ag REAL, SLO_F0 REAL, SLO_TCstar REAL, SLD_ag REAL, SLD_F0 REAL, SLD_TCstar REAL, "
+    "SLV_ag REAL, SLV_F0 REAL, SLV_TCstar REAL, SLC_ag REAL, SLC_F0 REAL, SLC_TCstar REAL, "
+    "gravity REAL, negative_zeros INTEGER NOT NULL) STRICT",
+
+    "CREATE TABLE pushovers(key INTEGER PRIMARY KEY, name TEXT NOT NULL, "
+    "control_node INTEGER NOT NULL, direction INTEGER NOT NULL, pattern_kind INTEGER NOT NULL, "
+    "negative_zeros INTEGER NOT NULL, body TEXT) STRICT",
+
+    "CREATE TABLE evaluations(key INTEGER PRIMARY KEY, name TEXT NOT NULL, push TEXT NOT NULL, "
+    "method INTEGER NOT NULL, procedure TEXT, spectrum TEXT NOT NULL, behavior INTEGER, "
+    "elastic_damping REAL, eigen_factors INTEGER, masonry INTEGER, drift_kind INTEGER, "
+    "plot_type INTEGER, alpha_in_percent INTEGER, has_bilinear INTEGER NOT NULL, "
+    "bilinear_rule TEXT, bilinear_secant REAL, bilinear_drop REAL, bilinear_iterate INTEGER, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+
+    "CREATE TABLE limit_state_steps(key INTEGER PRIMARY KEY, "
+    "negative_zeros INTEGER NOT NULL) STRICT",
+
+    "CREATE TABLE arrays(owner TEXT NOT NULL, key INTEGER NOT NULL, name TEXT NOT NULL, "
+    "kind TEXT NOT NULL, count INTEGER NOT NULL, width INTEGER NOT NULL, "
+    "byte_order TEXT NOT NULL, data BLOB NOT NULL, PRIMARY KEY(owner, key, name)) "
+    "STRICT, WITHOUT ROWID",
+
+    "CREATE TABLE results(key INTEGER PRIMARY KEY, steps INTEGER NOT NULL, "
+    "nodes INTEGER NOT NULL, negative_zeros INTEGER NOT NULL) STRICT",
+
+    // part: 0 load factors, 1 base reactions, 2 ids of 512 nodes, 3 displacements of 512 nodes in
+    // one step; of static results 4 ids of 512 nodes, 5 ids of 512 elements, 6 displacements and
+    // 7 reactions of the nodes, 8 forces of the elements. pushover is the key of the load case,
+    // of a static one from part 4 on. chunk and step count from 0 and are 0 where they mean
+    // nothing; step of a result of construction stages is its key in staged_results, from 1.
+    "CREATE TABLE result_blocks(pushover INTEGER NOT NULL, part INTEGER NOT NULL, "
+    "chunk INTEGER NOT NULL, step INTEGER NOT NULL, count INTEGER NOT NULL, "
+    "width INTEGER NOT NULL, byte_order TEXT NOT NULL, checksum INTEGER NOT NULL, "
+    "data BLOB NOT NULL, PRIMARY KEY(pushover, part, chunk, step)) STRICT, WITHOUT ROWID",
+
+    "CREATE TABLE checksums(name TEXT PRIMARY KEY, value INTEGER NOT NULL) STRICT, WITHOUT ROWID",
+
+    kMaterials, kSections, kHingeTypes, kInelasticHinges, kIncrementFunctions};
+
+/// Version 1 had no hinges and no load cases that are still to be run.
+void MigrateFrom1(const CSqliteDb& db)
+{
+    db.Exec("ALTER TABLE model ADD COLUMN concrete_code TEXT;"
+            "ALTER TABLE model ADD COLUMN steel_code TEXT;"
+            "ALTER TABLE model ADD COLUMN alternative_hysteresis INTEGER NOT NULL DEFAULT 0;"
+            "ALTER TABLE model ADD COLUMN wall_strength_degradation INTEGER NOT NULL DEFAULT 0;"
+            "ALTER TABLE model ADD COLUMN gsd INTEGER NOT NULL DEFAULT 0;"
+            "ALTER TABLE pushovers ADD COLUMN body TEXT");
+    for (const char* const sql :
+         {kMaterials, kSections, kHingeTypes, kInelasticHinges, kIncrementFunctions})
+        db.Exec(sql);
+}
+
+/// Version 2 had neither loads nor static results, and beams without ends of their own.
+void MigrateFrom2(const CSqliteDb& db)
+{
+    db.Exec("ALTER TABLE model ADD COLUMN plane INTEGER");
+    for (const char* const sql : kVersion3)
+        db.Exec(sql);
+}
+
+/// Version 3 had no construction stages. The body of the model is their control.
+void MigrateFrom3(const CSqliteDb& db)
+{
+    db.Exec("ALTER TABLE model ADD COLUMN body TEXT");
+    for (const char* const sql : kVersion4)
+        db.Exec(sql);
+}
+
+std::vector<std::string> AllTables()
+{
+    std::vector<std::string> all(std::begin(kTables), std::end(kTables));
+    all.insert(all.end(), std::begin(kVersion3), std::end(kVersion3));
+    all.insert(all.end(), std::begin(kVersion4), std::end(kVersion4));
+    return all;
+}
+
+} // namespace
+
+const T_SCHEMA& CurrentSchema()
+{
+    static constexpr T_MIGRATION kMigrations[] = {
+        {1, MigrateFrom1}, {2, MigrateFrom2}, {3, MigrateFrom3}};
+    static constexpr T_SCHEMA kSchema{4, kMigrations};
+    return kSchema;
+}
+
+void CreateSchema(const CSqliteDb& db)
+{
+    for (const std::string& sql : AllTables())
+        db.Exec(sql);
+    db.Exec("PRAGMA application_id = " + std::to_string(kModelApplicationId));
+    db.Exec("PRAGMA user_version = " + std::to_string(CurrentSchema().version));
+}
+
+void CheckSchema(const CSqliteDb& db)
+{
+    CSqliteStmt stmt(db, "SELECT type, sql FROM sqlite_schema ORDER BY rowid");
+    const std::vector<std::string> tables = AllTables();
+    std::size_t count = 0;
+    bool same = true;
+    while (same && stmt.Step()) {
+        same = count < tables.size() && stmt.Text(0) == "table" && stmt.Text(1) == tables[count];
+        ++count;
+    }
+    if (!same || count != tables.size())
+        ThrowDamaged(zql::lib::MMSGFunction::GetValue("IDS_QM_DB_DAMAGE_SCHEMA"));
+}
+
+void Migrate(const CSqliteDb& db, int from, const T_SCHEMA& schema)
+{
+    for (int version = from; version < schema.version; ++version) {
+        const auto step = std::find_if(schema.migrations.begin(), schema.migrations.end(),
+                                       [&](const T_MIGRATION& m) { return m.from == version; });
+        if (step == schema.migrations.end()) {
+            throw CStoreFault(FILE_FAULT::BadInput, "IDS_QM_DB_FILE_TOO_OLD", std::to_string(from),
+                              std::to_string(schema.version));
+        }
+        step->up(db);
+    }
+}

@@ -1,0 +1,138 @@
+#include "qm_db/store/modeltemp.h"
+
+#include "qm_db/file/storefault.h"
+
+#include <atomic>
+#include <cerrno>
+#include <charconv>
+#include <csignal>
+#include <cstdio>
+#include <ctime>
+#include <fcntl.h>
+#include <filesystem>
+#include <unistd.h>
+
+namespace fs = std::filesystem;
+
+namespace {
+
+constexpr const char* kMark = ".tmp-";
+constexpr const char* kCantWrite = "IDS_QM_DB_FILE_CANT_WRITE";
+constexpr std::time_t kOldS = 600; // longer than any save takes, s
+
+std::string TempPath(const std::string& target)
+{
+    static std::atomic<unsigned> counter{0};
+    return target + kMark + std::to_string(::getpid()) + '-' + std::to_string(++counter);
+}
+
+int CreateNew(const std::string& path, mode_t mode)
+{
+    const int descriptor = ::open(path.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, mode);
+    if (descriptor < 0) ThrowSystem(kCantWrite, errno);
+    return descriptor;
+}
+
+bool Exists(const std::string& path)
+{
+    struct stat status = {};
+    return ::stat(path.c_str(), &status) == 0;
+}
+
+std::string FolderOf(const std::string& path)
+{
+    const std::string folder = fs::path(path).parent_path().string();
+    return folder.empty() ? "." : folder;
+}
+
+/// "frame.qmdb.tmp-123-4" of the target "frame.qmdb" gives 123; anything else gives 0.
+pid_t ProcessOf(const std::string& name, const std::string& targetName)
+{
+    const std::string prefix = targetName + kMark;
+    if (!name.starts_with(prefix)) return 0;
+    const char* const end = name.data() + name.size();
+    pid_t process = 0;
+    const auto first = std::from_chars(name.data() + prefix.size(), end, process);
+    if (first.ec != std::errc{} || first.ptr == end || *first.ptr != '-') return 0;
+    unsigned counter = 0;
+    const auto second = std::from_chars(first.ptr + 1, end, counter);
+    return second.ec == std::errc{} && second.ptr == end && process > 0 ? process : 0;
+}
+
+bool IsStale(const std::string& path, pid_t process)
+{
+    const CFileHandle file(::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK | O_NOFOLLOW));
+    if (!file.IsOpen() || !file.TryLock()) return false;
+    const bool gone = ::kill(process, 0) != 0 && errno == ESRCH;
+    return gone || std::time(nullptr) - file.Status().st_mtime > kOldS;
+}
+
+} // namespace
+
+// Ours alone until it takes the old file's permissions; without an old file those of any new file.
+CModelTemp::CModelTemp(const std::string& target)
+    : m_target(target), m_path(TempPath(target)), m_targetExists(Exists(target)),
+      m_file(CreateNew(m_path, m_targetExists ? 0600 : 0666))
+{
+    if (m_file.TryLock()) return;
+    const int reason = errno;
+    ::unlink(m_path.c_str());
+    ThrowSystem(kCantWrite, reason);
+}
+
+CModelTemp::~CModelTemp()
+{
+    if (!m_isRemoved) ::unlink(m_path.c_str());
+}
+
+void CModelTemp::TakeOldPermissions() const
+{
+    struct stat old = {};
+    if (::stat(m_target.c_str(), &old) != 0) return;
+    const struct stat mine = m_file.Status();
+    // Another owner can be kept by root only; the set-id bits go with a change of owner anyway.
+    const bool sameOwner = (old.st_uid == mine.st_uid && old.st_gid == mine.st_gid) ||
+                           ::fchown(m_file.Get(), old.st_uid, old.st_gid) == 0;
+    const mode_t keep = sameOwner ? 07777 : 0777;
+    if (::fchmod(m_file.Get(), old.st_mode & keep) != 0) ThrowSystem(kCantWrite, errno);
+}
+
+void CModelTemp::Flush() const
+{
+    if (::fsync(m_file.Get()) != 0) ThrowSystem(kCantWrite, errno);
+}
+
+std::unique_ptr<CModelLock> CModelTemp::ReplaceTarget()
+{
+    const CFileHandle folder(
+        ::open(FolderOf(m_target).c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+    if (!folder.IsOpen()) ThrowSystem(kCantWrite, errno);
+
+    if (m_targetExists) {
+        TakeOldPermissions();
+        Flush();
+    }
+    const char* const from = m_path.c_str();
+    const char* const to = m_target.c_str();
+    int failed = -1;
+    errno = EINVAL;
+    if (!m_targetExists) failed = ::renameat2(AT_FDCWD, from, AT_FDCWD, to, RENAME_NOREPLACE);
+    if (failed && errno == EINVAL) failed = std::rename(from, to); // also: not all folders can that
+    if (failed) ThrowSystem(kCantWrite, errno);
+    m_isRemoved = true;
+
+    // The new file is whole and in its place; a folder that can't be flushed changes nothing.
+    (void)!::fsync(folder.Get());
+    return std::make_unique<CModelLock>(std::move(m_file));
+}
+
+void CModelTemp::SweepStale(const std::string& target)
+{
+    const std::string name = fs::path(target).filename().string();
+    std::error_code ignored; // what can't be read or removed stays
+    for (fs::directory_iterator it(FolderOf(target), ignored), end; it != end;
+         it.increment(ignored)) {
+        const pid_t process = ProcessOf(it->path().filename().string(), name);
+        if (process > 0 && IsStale(it->path().string(), process)) ::unlink(it->path().c_str());
+    }
+}

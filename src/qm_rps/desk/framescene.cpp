@@ -1,0 +1,241 @@
+#include "qm_rps/desk/framescene.h"
+
+#include <algorithm>
+#include <cmath>
+#include <limits>
+
+namespace {
+
+using S = T_SHAPE_SOURCE;
+
+constexpr double kShown = 0.05; // largest displacement on the picture over the frame's size
+
+double Length(const std::array<double, 3>& v)
+{
+    return std::hypot(v[0], v[1], v[2]);
+}
+
+double SizeOf(const T_FRAME_SCENE& scene)
+{
+    constexpr double kFar = std::numeric_limits<double>::infinity();
+    std::array<double, 3> low{kFar, kFar, kFar}, high{-kFar, -kFar, -kFar};
+    for (const T_SCENE_NODE& node : scene.nodes)
+        for (std::size_t d = 0; d < 3; ++d) {
+            low[d] = std::min(low[d], node.xyz[d]);
+            high[d] = std::max(high[d], node.xyz[d]);
+        }
+    return scene.nodes.empty() ? 0.0
+                               : Length({high[0] - low[0], high[1] - low[1], high[2] - low[2]});
+}
+
+/// Takes off what holds every node, as it does in a plane model: that is no support.
+void KeepSupports(std::vector<T_SCENE_NODE>& nodes)
+{
+    T_DIRS6 all{true, true, true, true, true, true};
+    for (const T_SCENE_NODE& node : nodes)
+        for (std::size_t d = 0; d < all.size(); ++d)
+            all[d] = all[d] && node.held[d];
+    for (T_SCENE_NODE& node : nodes)
+        for (std::size_t d = 0; d < all.size(); ++d)
+            node.held[d] = node.held[d] && !all[d];
+}
+
+/// Ends of elements with generated hinges, by element.
+std::map<int, T_ENDS<bool>> HingedEnds(const T_MODEL& model)
+{
+    std::map<int, T_ENDS<bool>> ends;
+    for (const auto& entry : model.hinges) {
+        T_ENDS<bool>& at = ends[entry.second.element];
+        const auto type = model.hingeTypes.find(entry.second.hingeType);
+        if (type == model.hingeTypes.end()) continue;
+        for (const T_HINGE_COMPONENT& c : type->second.components) {
+            at.I = at.I || (c.active && c.location != HINGE_LOCATION::JEnd);
+            at.J = at.J || (c.active && c.location != HINGE_LOCATION::IEnd);
+        }
+    }
+    return ends;
+}
+
+} // namespace
+
+void CFrameScene::Build()
+{
+    const T_MODEL& model = m_doc.Data().Model();
+    m_scene = {};
+    m_scene.title = model.styp.title;
+    m_scene.lengthUnit = NameOf(m_doc.Unit().Units().length);
+    std::map<int, std::size_t> at;
+    for (const auto& entry : model.nodes) {
+        T_SCENE_NODE node{entry.first, entry.second.xyz, {}};
+        for (double& x : node.xyz)
+            x = m_doc.Unit().ConvertUnitLengthOut(x);
+        for (std::size_t d = 0; d < node.held.size(); ++d)
+            node.held[d] = entry.second.restraint[d] != 0;
+        at[entry.first] = m_scene.nodes.size();
+        m_scene.nodes.push_back(node);
+    }
+    KeepSupports(m_scene.nodes);
+    const auto hinged = HingedEnds(model);
+    for (const auto& [id, e] : model.elements) {
+        if (e.kind == ELEM_KIND::Spring || !at.contains(e.nodeI) || !at.contains(e.nodeJ)) continue;
+        const auto ends = hinged.find(id);
+        const T_ENDS<bool> has = ends == hinged.end() ? T_ENDS<bool>{} : ends->second;
+        m_scene.lines.push_back({id, at[e.nodeI], at[e.nodeJ], e.kind, has.I, has.J});
+    }
+    m_revision = m_scene.revision = m_doc.Data().Revision();
+    m_pushover = 0;
+}
+
+const T_FRAME_SCENE& CFrameScene::Scene()
+{
+    if (m_revision != m_doc.Data().Revision()) Build();
+    return m_scene;
+}
+
+std::vector<T_SHAPE_SOURCE> CFrameScene::Sources()
+{
+    const T_MODEL& model = m_doc.Data().Model();
+    CPostCtrl& post = m_doc.Post();
+    std::vector<S> sources{{}};
+    for (const auto& [key, load] : model.loadCases)
+        if (post.CheckStaticResult(key)) sources.push_back({S::KIND::Static, key, load.name, 0});
+    if (!model.stages.empty() && post.CheckStagedResult())
+        for (const auto& [key, stage] : model.stages)
+            sources.push_back({S::KIND::Stage, key, stage.name, stage.steps});
+    for (const auto& [key, push] : model.pushovers)
+        if (post.SelectPushover(key))
+            sources.push_back({S::KIND::Pushover, key, push.name, post.GetStepCount()});
+    for (const auto& entry : model.modes)
+        sources.push_back({S::KIND::Mode, entry.first, std::to_string(entry.first), 0});
+    return sources;
+}
+
+/// read(node, values) gives 1, or 0 with the reason in the post-processor.
+template <class F>
+int CFrameScene::ReadNodes(F read, T_MOVES& out)
+{
+    T_MOVES moves(m_scene.nodes.size());
+    for (std::size_t n = 0; n < moves.size(); ++n) {
+        T_DOF6 values{};
+        if (!read(m_scene.nodes[n].id, values)) {
+            m_error = m_doc.Post().Error();
+            return 0;
+        }
+        moves[n] = {values[0], values[1], values[2]};
+    }
+    out = std::move(moves);
+    return 1;
+}
+
+int CFrameScene::FlatAxis(const T_FRAME_SCENE& scene)
+{
+    for (const int d : {1, 0, 2}) { // frames usually stand in XZ
+        const auto axis = static_cast<std::size_t>(d);
+        const auto same = [&](const T_SCENE_NODE& node) {
+            return node.xyz[axis] == scene.nodes.front().xyz[axis];
+        };
+        if (scene.nodes.size() > 1 && std::ranges::all_of(scene.nodes, same)) return d;
+    }
+    return -1;
+}
+
+/// All steps at once: a slider then reads no file.
+int CFrameScene::ReadSeries(int key)
+{
+    if (m_pushover == key) return 1;
+    const auto result = m_doc.Data().Content().results.find(key);
+    if (result == m_doc.Data().Content().results.end()) return 0;
+    const T_UNITS units = m_doc.Unit().Units();
+    std::vector<std::vector<double>> series(m_scene.nodes.size());
+    for (std::size_t n = 0; n < series.size(); ++n) {
+        if (!result->second->HasNode(m_scene.nodes[n].id)) continue;
+        if (!result->second->ReadDisplacements(m_scene.nodes[n].id, series[n])) {
+            m_error = result->second->Error();
+            return 0;
+        }
+        for (double& u : series[n])
+            u = FromSi(u, units, kDimLength);
+    }
+    m_series = std::move(series);
+    m_pushover = key;
+    return 1;
+}
+
+int CFrameScene::ReadPushover(int key, int step, T_MOVES& out)
+{
+    const auto push = m_doc.Data().Model().pushovers.find(key);
+    if (push == m_doc.Data().Model().pushovers.end() || step < 1) return 0;
+    const auto direction = static_cast<std::size_t>(push->second.direction - 1);
+    if (direction < 3 && !ReadSeries(key)) return 0;
+    out.assign(m_scene.nodes.size(), {});
+    const auto index = static_cast<std::size_t>(step - 1);
+    for (std::size_t n = 0; direction < 3 && n < out.size(); ++n) // a rotation moves no node
+        if (index < m_series[n].size()) out[n][direction] = m_series[n][index];
+    return 1;
+}
+
+int CFrameScene::Read(const T_SHAPE_SOURCE& source, int step, T_MOVES& out)
+{
+    (void)Scene();
+    m_error.clear();
+    CPostCtrl& post = m_doc.Post();
+    switch (source.kind) {
+    case S::KIND::Static:
+        if (!post.SelectLoadCombNew(CPostCtrl::MakeLoadComb(source.key))) return 0;
+        return ReadNodes([&](int node, T_DOF6& v) { return post.GetDispNew(node, v); }, out);
+    case S::KIND::Stage:
+        post.SelectStage(source.key, step, kStageLoadSum);
+        return ReadNodes([&](int node, T_DOF6& v) { return post.GetDspcNew(node, v); }, out);
+    case S::KIND::Pushover:
+        return ReadPushover(source.key, step, out);
+    case S::KIND::Mode: {
+        if (!post.SelectMode(source.key)) return 0;
+        return ReadNodes(
+            [&](int node, T_DOF6& v) {
+                post.GetEiMode(node, v);
+                return 1;
+            },
+            out);
+    }
+    case S::KIND::None:
+        break;
+    }
+    out.assign(m_scene.nodes.size(), {});
+    return 1;
+}
+
+std::vector<T_SCENE_DRIFT> CFrameScene::Drifts(const T_SHAPE_SOURCE& source, int step)
+{
+    std::vector<T_SCENE_DRIFT> out;
+    std::vector<T_STOREY_DRIFT> drifts;
+    if (source.kind != S::KIND::Pushover ||
+        !m_doc.Post().GetPushoverStoryDrifts(source.key, step, drifts))
+        return out;
+    const auto& storeys = m_doc.Data().Model().storeys;
+    double base = std::numeric_limits<double>::infinity();
+    for (const T_SCENE_NODE& node : Scene().nodes)
+        base = std::min(base, node.xyz[2]);
+    double bottom = base, top = base;
+    std::size_t next = 0;
+    for (const auto& [key, storey] : storeys) {
+        top += m_doc.Unit().ConvertUnitLengthOut(storey.height);
+        if (next == drifts.size() || drifts[next].storey != key) continue;
+        out.push_back({storey.name, bottom, top, drifts[next++].plain});
+        bottom = top;
+    }
+    return out;
+}
+
+double CFrameScene::RoundScale(const T_FRAME_SCENE& scene, const T_MOVES& displacement)
+{
+    double largest = 0.0;
+    for (const auto& move : displacement)
+        largest = std::max(largest, Length(move));
+    const double wanted = kShown * SizeOf(scene);
+    if (!(largest > 0.0) || !(wanted > 0.0)) return 1.0;
+    const double scale = wanted / largest;
+    const double power = std::pow(10.0, std::floor(std::log10(scale)));
+    for (const double digit : {5.0, 2.0})
+        if (scale >= digit * power) return digit * power;
+    return power;
+}

@@ -1,0 +1,9 @@
+#include "qm_rps/dialog/hingedialog.h"
+
+int CHingeDialog::CheckData()
+{
+    const std::vector<T_FINDING> found = Findings();
+    if (found.empty()) return 1;
+    ShowMessage(found.front().messageKey, found.front().text);
+    return 0;
+}

@@ -1,0 +1,109 @@
+#include "qm_rps/factors/ulfiterationdochost.h"
+
+#include "qm_base/messagehistory.h"
+#include "qm_base/msgfunction.h"
+
+#include <set>
+
+using zql::lib::MMSGFunction;
+
+int CUlfIterationDocHost::Refuse(const std::string& text)
+{
+    m_error = text;
+    GSaveHistoryFormatNF("%s", text.c_str());
+    return 0;
+}
+
+int CUlfIterationDocHost::Solve(std::vector<T_ULF_ITER_ROW>& rows)
+{
+    if (!m_dialog.OnCalculate()) {
+        m_error = m_dialog.Messages().empty() ? "" : m_dialog.Messages().back().text;
+        return 0;
+    }
+    rows = m_dialog.SolvedRows();
+    return 1;
+}
+
+int CUlfIterationDocHost::SaveCopy(const std::string& path)
+{
+    T_FILE_ERROR error;
+    return m_doc.SaveAs(path, error) ? 1 : Refuse(error.text);
+}
+
+int CUlfIterationDocHost::StartEdit(const std::string& title)
+{
+    m_isScaled = false;
+    m_before = m_doc.Data().StagedResult();
+    return m_doc.Undo().StartEditDB(title);
+}
+
+int CUlfIterationDocHost::ScaleLoad(int loadCase, double factor)
+{
+    T_STLD_D load;
+    if (!m_doc.Attr().GetStld(loadCase, load)) return 0;
+    std::set<int> elements; // several tensions of one element are read and written as one
+    for (const T_PTNS_D& p : load.pretension)
+        elements.insert(p.element);
+    for (const int element : elements) {
+        T_PTNS_D pretension;
+        bool done = m_doc.Attr().GetPtns(loadCase, element, pretension) != 0;
+        pretension.force *= factor;
+        done = done && m_doc.Edit().AddPtns(loadCase, pretension);
+        if (!done)
+            return Refuse(MMSGFunction::Format("IDS_QM_ULF_PRETENSION_NOT_CHANGED",
+                                               {std::to_string(element), load.name}));
+        m_isScaled = true;
+    }
+    return 1;
+}
+
+int CUlfIterationDocHost::ScalePretension(std::size_t unknown, double factor)
+{
+    const T_ULSI_ROW& row = m_dialog.m_rows[m_dialog.RowOfUnknown(unknown)];
+    for (const int loadCase : LoadsScaledBy(m_doc.Data().Model(), row))
+        if (!ScaleLoad(loadCase, factor)) return 0;
+    return 1;
+}
+
+int CUlfIterationDocHost::CloseEdit()
+{
+    return m_doc.Undo().CloseEditDB();
+}
+
+void CUlfIterationDocHost::CancelEdit()
+{
+    if (m_doc.Edit().IsOpen()) (void)m_doc.Undo().CancelEditDB();
+    m_isScaled = false;
+}
+
+void CUlfIterationDocHost::UndoEdit()
+{
+    if (m_isScaled && m_doc.Undo().Undo()) m_doc.Data().SetStagedResult(m_before);
+    m_isScaled = false;
+}
+
+int CUlfIterationDocHost::StartAnalysis()
+{
+    T_ANALYSIS_OPTIONS options;
+    options.allCases = false;
+    T_ANALYSIS_ERROR error;
+    m_isAnalysed = false;
+    return m_doc.StartAnalysis(options, error) ? 1 : Refuse(error.text);
+}
+
+int CUlfIterationDocHost::EndAnalysis()
+{
+    T_ANALYSIS_ERROR error;
+    if (m_doc.AnalysisOutcome(error)) return SaveCopy(m_doc.Path());
+    return error.fault == ANALYSIS_FAULT::Cancelled ? 0 : Refuse(error.text);
+}
+
+void CUlfIterationDocHost::DispatchEvents()
+{
+    constexpr int kWaitMs = 2; // short enough for a window
+    if (m_view) m_view->DispatchEvents();
+    if (!m_doc.IsExcuted()) return;
+    if (m_doc.PollAnalysis(kWaitMs)) return;
+    m_isAnalysed = EndAnalysis() != 0;
+    if (m_isAnalysed) m_before = nullptr;
+}

@@ -1,0 +1,117 @@
+// Rules of hinge editors as table rows, one walker over them, and what they find.
+#pragma once
+
+#include "qm_db/records.h"
+
+#include <span>
+#include <string>
+#include <vector>
+
+enum class HINGE_END { Both, I, J };
+enum class HINGE_SIDE { None, Positive, Negative };
+
+/// One rule that is not kept.
+struct T_FINDING {
+    std::string field;      // path in the record of the curve or dialog: "sides.pos.B.strength"
+    std::string ruleText;   // the rule as the program words it, "F(B) > 0", or the item's key
+    std::string messageKey; // of the message that reports it
+    std::string text;       // that message, filled in
+    std::string wording;    // the relation in words, where a catalogue text has it
+    int component = -1;     // HINGE_COMPONENT; -1: not of a component
+    HINGE_END end = HINGE_END::Both;
+    HINGE_SIDE side = HINGE_SIDE::None;
+    std::string point; // "B" to "E", "IO" ...; empty: no point
+    bool operator==(const T_FINDING&) const = default;
+};
+
+/// Where a curve stands. curve: its index in the list by axial force; -1: no list.
+struct T_PLACE {
+    int component = -1;
+    HINGE_END end = HINGE_END::Both;
+    int curve = -1;
+    std::string prefix{}; // of the field: "masonry."
+    std::string point{};  // where the rule names none
+};
+
+/// What a rule's text is: a literal (with %s for the symbol of deformation "D" or strength "F" or
+/// "M"), or the key of a catalogue text.
+enum class RULE_TEXT { Literal, Deform, Strength, Key };
+
+/// All of a rule but its condition.
+struct T_RULE_HEAD {
+    const char* messageKey; // {1} component, {2} rule
+    RULE_TEXT kind;
+    const char* text;       // null: the message says it all
+    const char* textMoment; // the same for Mx, My, Mz; null: text
+    const char* field;
+    HINGE_SIDE side = HINGE_SIDE::None;
+    const char* point = "";
+    const char* suffix = "";            // follows a catalogue text: " > 0"
+    const char* wordingKey = nullptr;   // relation in words, {1} left, {2} right
+    const char *left = "", *right = ""; // with %s for the symbol
+    int component = -1;                 // of a rule that belongs to one; -1: the place's
+};
+
+template <class DATA>
+struct T_RULE {
+    T_RULE_HEAD head;
+    bool (*holds)(const DATA&);             // must be false for a NaN
+    bool (*applies)(const DATA&) = nullptr; // null: always
+};
+
+/// The finding of a rule that is not kept.
+T_FINDING FindingOf(const T_RULE_HEAD& head, const T_PLACE& place);
+
+/// Where the finding stands in a hinge type: "My.sides.pos.B.strength", of the J-end
+/// "My.J.sides.pos.B.strength"; the field alone where it is of no component.
+std::string PathInType(const T_FINDING& f);
+/// Where it stands on the pages of one component: of the J-end "J.sides.pos.B.strength".
+std::string PathOnPages(const T_FINDING& f);
+
+/// The walker: appends what is not kept, in the order of the table.
+template <class DATA>
+void WalkRules(std::span<const T_RULE<DATA>> rules, const DATA& data, const T_PLACE& place,
+               std::vector<T_FINDING>& out)
+{
+    for (const T_RULE<DATA>& r : rules)
+        if ((!r.applies || r.applies(data)) && !r.holds(data))
+            out.push_back(FindingOf(r.head, place));
+}
+
+inline constexpr const char* kHingeRuleMessage =
+    "IDS_RPS_Error_Pushove_Hinge_Properties_DOF_s_contains_ERROR";
+inline constexpr const char* kHingeItemMessage =
+    "IDS_RPS_Error_Pushove_Hinge_Properties_DOF_s_contains_ERROR_Item_s";
+
+inline bool IsMoment(int component)
+{
+    return component >= static_cast<int>(HINGE_COMPONENT::Mx);
+}
+
+/// Separate pages for the I-end and the J-end.
+inline bool NeedsIJPages(const T_HINGE_COMPONENT& c)
+{
+    return !c.sameEnds && c.location == HINGE_LOCATION::BothEnds;
+}
+
+/// Calls use(end, curve) for each page of a component: two where the ends differ, else one.
+template <class COMPONENT, class USE>
+void ForEachPage(COMPONENT& c, USE use)
+{
+    if (NeedsIJPages(c)) {
+        use(HINGE_END::I, c.curves.I);
+        use(HINGE_END::J, c.curves.J);
+        return;
+    }
+    const bool jEnd = c.location == HINGE_LOCATION::JEnd;
+    const HINGE_END end = c.location == HINGE_LOCATION::IEnd ? HINGE_END::I
+                          : jEnd                             ? HINGE_END::J
+                                                             : HINGE_END::Both;
+    use(end, jEnd && !c.sameEnds ? c.curves.J : c.curves.I);
+}
+
+/// Keys of the titles of a component's pages, one or two.
+std::vector<const char*> PageTitleKeys(const T_HINGE_COMPONENT& c);
+
+/// Key of the title of a component's page: I-end, J-end, both ends alike, or plain.
+const char* PageTitleKey(const T_HINGE_COMPONENT& c, HINGE_END end);

@@ -1,0 +1,30 @@
+// Names and units that the editors of hinges show.
+#pragma once
+
+#include "qm_db/records.h"
+
+#include <string>
+#include <vector>
+
+/// The type that an editor of one of its parts belongs to, and the units of its values.
+struct T_HINGE_OWNER {
+    T_PHGT_D type;
+    T_UNITS units;
+};
+
+/// A key's text, or the text itself, with the unit where the quantity has one: "Span (m)".
+std::string HingeHead(const std::string& name, T_DIM dim, const T_UNITS& units);
+/// The same for a strength, a deformation (a rotation in rad) and a stiffness of a component.
+std::string StrengthHead(const std::string& name, HINGE_COMPONENT c, const T_HINGE_OWNER& owner);
+std::string DeformHead(const std::string& name, HINGE_COMPONENT c, const T_HINGE_OWNER& owner);
+std::string StiffnessHead(const std::string& name, HINGE_COMPONENT c, const T_HINGE_OWNER& owner);
+/// Key of the yield deformation's name: displacement, rotation, curvature or strain.
+const char* YieldDeformKey(HINGE_COMPONENT c, HINGE_DEFINITION definition);
+
+/// Initial stiffness options of a component: 6EI/L, 3EI/L, 2EI/L and user of bending, the elastic
+/// stiffness and user of the others.
+std::vector<INIT_STIFFNESS> StiffnessOptions(HINGE_COMPONENT c);
+std::vector<std::string> StiffnessTexts(HINGE_COMPONENT c);
+/// Position of an option in that list; -1: the component has no such. Of Fx and Mx every option
+/// but user is the elastic stiffness.
+int StiffnessPosition(HINGE_COMPONENT c, INIT_STIFFNESS option);

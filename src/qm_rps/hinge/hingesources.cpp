@@ -1,0 +1,33 @@
+#include "qm_rps/hinge/hingesources.h"
+
+namespace {
+
+template <class R>
+const R* Find(const T_TABLE<R>& table, int key)
+{
+    const auto at = table.find(key);
+    return at == table.end() ? nullptr : &at->second;
+}
+
+} // namespace
+
+const T_SECT_D* CHingeSources::Section(int key) const
+{
+    return Find(m_sections, key);
+}
+
+const T_MATL_D* CHingeSources::Material(int key) const
+{
+    return Find(m_materials, key);
+}
+
+const CHingeSources::T_RESULT* CHingeSources::Strength(int section, int material) const
+{
+    const T_SECT_D* s = Section(section);
+    const T_MATL_D* m = Material(material);
+    if (!s || !m) return nullptr;
+    const auto [at, fresh] = m_results.try_emplace({section, material});
+    T_RESULT& r = at->second;
+    if (fresh && !CSectionStrength::Calc(*s, *m, r.strength, r.fault)) r.strength = {};
+    return &r;
+}

@@ -1,9 +1,0 @@
-#include "qm_rps/hingedialog.h"
-
-int CHingeDialog::CheckData()
-{
-    const std::vector<T_FINDING> found = Findings();
-    if (found.empty()) return 1;
-    ShowMessage(found.front().messageKey, found.front().text);
-    return 0;
-}

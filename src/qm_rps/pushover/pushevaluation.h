@@ -1,0 +1,96 @@
+// The finished result of one evaluation: what reports, pictures, JSON and windows read.
+// Lengths, forces and masses in the model's current units; Sa in g, periods in s, damping in per
+// cent. MDOF values are SDOF values times Gamma.
+#pragma once
+
+#include "qm_base/mdialog.h"
+#include "qm_rps/pushover/pushovercurvedata.h"
+#include "qm_rps/pushover/pushovertargetdisp.h"
+
+/// A performance point.
+struct T_PERF_POINT {
+    double Sd = 0.0, Sa = 0.0;     // SDOF
+    double D = 0.0, V = 0.0;       // control displacement, base shear
+    double Teff = 0.0;             // secant period 2 pi sqrt(Sd / (Sa g))
+    std::optional<double> damping; // where the procedure sets one
+};
+
+/// One row of the limit-state table; what the window shows as "-" is empty.
+struct T_LIMIT_ROW {
+    std::string name;
+    std::optional<double> demand, capacity; // MDOF
+    std::optional<int> demandStep, capacityStep;
+    std::string remark; // "OK", "N/A", "NG" or empty
+};
+
+/// A vertical guide line on the capacity spectrum.
+struct T_GUIDE_LINE {
+    enum class KIND { Demand, Capacity, Qstar3 };
+    KIND kind = KIND::Demand;
+    double Sd = 0.0; // SDOF
+    std::string label;
+};
+
+/// A step that the engineer asked for: MDOF values.
+struct T_ADDITIONAL_STEP {
+    int step = 0;
+    double D = 0.0, V = 0.0;   // control displacement, base shear
+    double Sd = 0.0, Sa = 0.0; // SDOF
+};
+
+/// A performance point for another spectrum on the same curve.
+struct T_ADDITIONAL_POINT {
+    std::string spectrum;
+    int result = 0;
+    std::optional<T_PERF_POINT> point;
+    T_OUTCOME outcome;
+};
+
+/// A curve in the coordinates of a plot type.
+struct T_PLOTTED_CURVE {
+    PLOT_TYPE type = PLOT_TYPE::Atc40;
+    std::vector<double> x, y; // index = step
+};
+
+struct T_PUSH_EVALUATION {
+    T_EVAL_D eval; // as asked for
+    char procedure = 'A';
+    int result = 0; // 0 not found, 1 found, 2 found and elastic
+    T_POLC_D loadCase;
+    T_UNITS units;
+    T_PUSH_FACTORS factors;
+    double mStar = 0.0; // mass of the equivalent system
+
+    T_ADRS_CURVE capacity;                  // index = step; 0 is a tenth of step 1
+    T_ADRS_CURVE demand;                    // the record at its own damping; NTC: SLV
+    std::vector<T_ADRS_CURVE> stateDemands; // NTC: SLO, SLD, SLV, SLC; empty where not enabled
+    std::string gammaNote;                  // how Gamma is defined for this method
+    T_ADRS_CURVE reduced;                   // at the performance point, may be empty
+    T_ADRS_CURVE working;      // FEMA 440: the last reduced or modified spectrum, may be empty
+    T_ADRS_CURVE locus;        // ATC-40 B, FEMA 440 C: demand points, may be empty
+    std::vector<double> teffs; // ATC-40 B: T0 and Teff at ductility 2, 4, 6, 8
+    std::optional<T_PERF_POINT> point;
+    std::vector<T_PERFPT_TRIAL> trace;
+    std::vector<T_PERF_POINT> allPoints; // where demand equals capacity, in the curve's order
+    std::string pointNote; // how the procedure's answer lies to those points, where that matters
+    std::vector<T_ADDITIONAL_STEP> additionalSteps;
+    std::vector<T_ADDITIONAL_POINT> additionalPoints;
+
+    std::optional<T_BILINEAR> bilinear;
+    std::vector<T_TARGET_DISP> targets; // one; NTC: SLO, SLD, SLV, SLC
+    std::vector<T_LIMIT_ROW> limitStates;
+    std::vector<T_GUIDE_LINE> guideLines;
+
+    T_PLOTTED_CURVE curve; // the one that the report tabulates
+    T_OUTCOME outcome;
+    std::vector<zql::frx::T_MESSAGE> messages;
+
+    bool IsTarget() const { return eval.method >= PUSH_METHOD::Ec8Opcm; }
+    bool IsMasonry() const
+    {
+        return eval.method == PUSH_METHOD::Ec8Opcm && eval.masonry.value_or(false);
+    }
+};
+
+/// "ATC-40", "FEMA440", "EC8/OPCM", "NTC2008", "NTC2018".
+const char* MethodName(PUSH_METHOD method);

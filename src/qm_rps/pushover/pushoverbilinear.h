@@ -1,0 +1,42 @@
+// Bilinear (elastic-perfectly plastic) capacity spectrum of the target-displacement methods.
+#pragma once
+
+#include "qm_rps/pushover/pushoverperfptrecord.h"
+
+enum class BILINEAR_RULE { Ec8, Ntc, Masonry };
+
+struct T_BILINEAR_OPTIONS {
+    BILINEAR_RULE rule = BILINEAR_RULE::Ec8;
+    double secant = 0.6;  // fraction of the strength that fixes the stiffness (ntc, masonry)
+    double drop = 0.85;   // fraction of the strength that ends the curve (ntc, masonry)
+    bool iterate = false; // EN 1998-1 B.3: repeat with the target displacement (ec8)
+};
+
+/// Points of the bilinear curve: origin, yield (dy, ay), ultimate (du, au). Lengths, g.
+struct T_BILINEAR {
+    double dy = 0.0, ay = 0.0;
+    double du = 0.0, au = 0.0;
+    bool operator==(const T_BILINEAR&) const = default;
+};
+
+/// Defaults of a rule: ntc 0.6 and 0.85 (NTC C7.3.4.2), masonry 0.7 and 0.8 (C7.8.1.6).
+T_BILINEAR_OPTIONS BilinearDefaults(BILINEAR_RULE rule);
+
+/// Index of the first global maximum of the accelerations.
+std::size_t FirstMaximum(const std::vector<double>& Sa);
+
+/// Area under a curve from its first point to d: whole trapezoids up to d, the last one cut.
+double CurveArea(const T_ADRS_VIEW& curve, double d);
+
+/// Sa on a curve at d: of the first segment that holds d, the last ordinate beyond the curve.
+double CurveAccelAt(const T_ADRS_VIEW& curve, double d);
+
+/// EN 1998-1 Annex B.3: equal energy up to dm, yield force = force at dm, which is `ay`. `curve`
+/// starts at the origin. 1 done; 0 no yield point (no force, or too little energy), output as it
+/// was.
+[[nodiscard]] int CalcBilinearEc8(const T_ADRS_VIEW& curve, double dm, double ay, T_BILINEAR& out);
+
+/// NTC C7.3.4.2: secant through a fraction of the peak, equal area to the displacement where the
+/// force has dropped. As above.
+[[nodiscard]] int CalcBilinearNtc(const T_ADRS_VIEW& curve, const T_BILINEAR_OPTIONS& options,
+                                  T_BILINEAR& out);

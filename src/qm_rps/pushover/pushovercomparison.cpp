@@ -1,0 +1,93 @@
+#include "qm_rps/pushover/pushovercomparison.h"
+
+#include "qm_rps/pushovercurvedlg.h"
+
+#include <algorithm>
+
+namespace {
+
+struct T_METHOD_ROW {
+    PUSH_METHOD method;
+    char procedure;
+    const char* label;
+    const char* state; // limit state that stands for a target-displacement method
+};
+
+// clang-format off
+constexpr std::array<T_METHOD_ROW, 8> kMethods{{
+    {PUSH_METHOD::Atc40,   'A', "ATC-40 A",    nullptr},
+    {PUSH_METHOD::Atc40,   'B', "ATC-40 B",    nullptr},
+    {PUSH_METHOD::Fema440, 'A', "FEMA440 A",   nullptr},
+    {PUSH_METHOD::Fema440, 'B', "FEMA440 B",   nullptr},
+    {PUSH_METHOD::Fema440, 'C', "FEMA440 C",   nullptr},
+    {PUSH_METHOD::Ec8Opcm, 'A', "EC8 SD",      "SD"},
+    {PUSH_METHOD::Ntc2008, 'A', "NTC2008 SLV", "SLV"},
+    {PUSH_METHOD::Ntc2018, 'A', "NTC2018 SLV", "SLV"},
+}};
+// clang-format on
+
+T_COMPARISON_ROW RowOf(const T_METHOD_ROW& method, const T_PUSH_EVALUATION& e,
+                       const CPushOverCurveDlg& driver)
+{
+    T_COMPARISON_ROW row;
+    row.label = method.label;
+    row.outcome = e.outcome;
+    if (e.point) {
+        row.found = true;
+        row.Sd = e.point->Sd;
+        row.Sa = e.point->Sa;
+        row.D = e.point->D;
+        row.V = e.point->V;
+    }
+    for (const T_LIMIT_ROW& state : e.limitStates) {
+        if (!method.state || state.name != method.state || !state.demand) continue;
+        row.found = true;
+        row.D = *state.demand;
+        row.Sd = e.factors.gamma != 0.0 ? row.D / e.factors.gamma : 0.0;
+        row.Sa = row.V = CurveAccelAt(e.capacity.View(), row.Sd);
+        driver.TransferToDispAndReac(nullptr, &row.V);
+    }
+    return row;
+}
+
+void CalcSpread(T_PUSH_COMPARISON& c)
+{
+    double sum = 0.0;
+    for (const T_COMPARISON_ROW& row : c.rows) {
+        if (!row.found) continue;
+        c.minD = c.count == 0 ? row.D : std::min(c.minD, row.D);
+        c.maxD = std::max(c.maxD, row.D);
+        sum += row.D;
+        ++c.count;
+    }
+    if (c.count > 0) c.meanD = sum / c.count;
+}
+
+} // namespace
+
+int ComparePushover(CDBDoc& doc, const std::string& push, const std::string& spectrum, int behavior,
+                    T_PUSH_COMPARISON& out, std::string& error)
+{
+    T_PUSH_COMPARISON c;
+    CPushOverCurveDlg driver(doc);
+    driver.SetStoreSteps(false);
+    for (const T_METHOD_ROW& method : kMethods) {
+        T_EVAL_D eval;
+        eval.name = method.label;
+        eval.push = push;
+        eval.spectrum = spectrum;
+        eval.method = method.method;
+        eval.procedure = method.procedure;
+        eval.behavior = behavior;
+        if (!driver.SetEvaluation(eval)) {
+            error = driver.SettingsError();
+            return 0;
+        }
+        driver.Evaluate();
+        c.rows.push_back(RowOf(method, driver.Result(), driver));
+        c.results.push_back(driver.Result());
+    }
+    CalcSpread(c);
+    out = std::move(c);
+    return 1;
+}

@@ -1,0 +1,25 @@
+// Every applicable method on one capacity curve with one spectrum, side by side.
+#pragma once
+
+#include "qm_rps/pushover/pushevaluation.h"
+
+struct T_COMPARISON_ROW {
+    std::string label; // "ATC-40 A", "EC8 SD", "NTC2018 SLV"
+    bool found = false;
+    double Sd = 0.0, Sa = 0.0; // the point; of a target displacement, the curve at it
+    double D = 0.0, V = 0.0;   // MDOF
+    T_OUTCOME outcome;
+};
+
+struct T_PUSH_COMPARISON {
+    std::vector<T_PUSH_EVALUATION> results; // in the order of the rows
+    std::vector<T_COMPARISON_ROW> rows;
+    int count = 0;                              // rows with a displacement
+    double minD = 0.0, maxD = 0.0, meanD = 0.0; // over those rows
+};
+
+/// ATC-40 A and B, FEMA 440 A, B and C, Eurocode 8 (SD) and NTC 2008 and 2018 (SLV), with their
+/// defaults and the given behaviour type (0 to 2). The model is not changed. 1 done; 0 there is
+/// no such load case or spectrum (error says which), output as it was.
+[[nodiscard]] int ComparePushover(CDBDoc& doc, const std::string& push, const std::string& spectrum,
+                                  int behavior, T_PUSH_COMPARISON& out, std::string& error);

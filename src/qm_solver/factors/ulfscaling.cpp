@@ -1,0 +1,104 @@
+#include "qm_solver/factors/ulfscaling.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace {
+
+constexpr double kLargestRhs = 1e300; // beyond it a scaled right-hand side is no bound at all
+
+constexpr long double kNoise = 1e-17L; // part of the largest factor that is rounding
+
+bool AllFinite(std::span<const double> values)
+{
+    return std::all_of(values.begin(), values.end(), [](double v) { return std::isfinite(v); });
+}
+
+/// Divides row i by the weights and by its length. Long double holds every product of doubles, so
+/// neither can overflow.
+void ScaleRow(const T_ULF_PROBLEM& problem, std::size_t i, T_ULF_SCALED& s)
+{
+    const std::span<const double> row = problem.Row(i);
+    long double sum = 0.0L;
+    for (std::size_t j = 0; j < s.nVar; ++j) {
+        const long double v = row[j] / s.weight[j];
+        sum += v * v;
+    }
+    const long double norm = sum > 0.0L ? std::sqrt(sum) : 1.0L;
+    s.rowNorm[i] = norm;
+    for (std::size_t j = 0; j < s.nVar; ++j)
+        s.rows[i * s.nVar + j] = static_cast<double>(row[j] / s.weight[j] / norm);
+}
+
+long double RhsScale(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& s)
+{
+    long double largest = 0.0L;
+    for (std::size_t i = 0; i < s.nCon; ++i) {
+        const long double b = problem.rhs[i] / s.rowNorm[i];
+        largest = std::max(largest, i < s.nEq ? std::fabs(b) : -b);
+    }
+    return largest > 0.0L ? std::exp2(std::floor(std::log2(largest))) : 1.0L;
+}
+
+} // namespace
+
+int CheckUlfProblem(const T_ULF_PROBLEM& p)
+{
+    if (p.nVar < 1 || p.nEq < 0 || static_cast<std::size_t>(p.nEq) > p.Rows()) return 0;
+    const std::size_t n = static_cast<std::size_t>(p.nVar);
+    if (p.weights.size() != n || p.coefficients.size() != n * p.Rows()) return 0;
+    if (p.sign < -1 || p.sign > 1) return 0;
+    if (!AllFinite(p.coefficients) || !AllFinite(p.rhs) || !AllFinite(p.weights)) return 0;
+    return std::all_of(p.weights.begin(), p.weights.end(), [](double w) { return w >= 0.0; });
+}
+
+std::vector<long double> UlfWeights(std::span<const double> weights)
+{
+    double smallest = 0.0;
+    for (double w : weights)
+        if (w > 0.0 && (smallest <= 0.0 || w < smallest)) smallest = w;
+    const long double free =
+        smallest > 0.0 ? kUlfFreeWeight * static_cast<long double>(smallest) : 1.0L;
+    std::vector<long double> all(weights.begin(), weights.end());
+    for (long double& w : all)
+        if (!(w > 0.0L)) w = free;
+    return all;
+}
+
+T_ULF_SCALED ScaleUlf(const T_ULF_PROBLEM& problem)
+{
+    T_ULF_SCALED s;
+    s.nVar = static_cast<std::size_t>(problem.nVar);
+    s.nCon = problem.Rows();
+    s.nEq = static_cast<std::size_t>(problem.nEq);
+    s.sign = problem.sign;
+    s.weight = UlfWeights(problem.weights);
+    for (double w : problem.weights)
+        s.cost.push_back(w > 0.0 ? 1.0 : 0.0);
+    s.rows.resize(s.nCon * s.nVar);
+    s.rowNorm.resize(s.nCon);
+    for (std::size_t i = 0; i < s.nCon; ++i)
+        ScaleRow(problem, i, s);
+    s.rhsScale = RhsScale(problem, s);
+    s.rhs.resize(s.nCon);
+    for (std::size_t i = 0; i < s.nCon; ++i) {
+        const long double b = problem.rhs[i] / s.rowNorm[i] / s.rhsScale;
+        s.rhs[i] = static_cast<double>(std::clamp<long double>(b, -kLargestRhs, kLargestRhs));
+    }
+    return s;
+}
+
+std::vector<double> UnscaleUlf(const T_ULF_SCALED& scaled, std::span<const long double> y)
+{
+    std::vector<double> x(scaled.nVar);
+    long double size = 0.0L;
+    for (long double v : y)
+        size = std::max(size, std::fabs(v));
+    for (std::size_t j = 0; j < scaled.nVar; ++j) {
+        const bool isNoise = std::fabs(y[j]) <= kNoise * size;
+        const bool isPastSign = scaled.sign * y[j] < 0.0L; // within the tolerance of a row
+        if (!isNoise && !isPastSign)
+            x[j] = static_cast<double>(y[j] * scaled.rhsScale / scaled.weight[j]);
+    }
+    return x;
+}

@@ -1,0 +1,105 @@
+#include "qm_ui/form/dialogwindow.h"
+
+#include "qm_base/msgfunction.h"
+#include "qm_rps/dialog/hingedialog.h"
+
+#include <QDialogButtonBox>
+#include <QEvent>
+#include <QPushButton>
+#include <QScreen>
+#include <QScrollArea>
+#include <QVBoxLayout>
+
+namespace {
+
+QString Text(const char* key)
+{
+    return QString::fromStdString(zql::lib::MMSGFunction::GetValue(key));
+}
+
+} // namespace
+
+CDialogWindow::CDialogWindow(const CViewFactory& factory, const T_VIEW& view,
+                             zql::frx::MDialog& model, QWidget* parent)
+    : QDialog(parent), m_view(view), m_model(model), m_before(model.View()),
+      m_dialogView(factory, this), m_form(new CFormView(this)), m_scroll(new QScrollArea(this)),
+      m_buttons(new QDialogButtonBox(this))
+{
+    setWindowFlag(Qt::WindowMaximizeButtonHint);
+    m_model.SetView(&m_dialogView);
+    m_form->m_message = [this](const char* key) {
+        m_dialogView.ShowMessage(key, zql::lib::MMSGFunction::GetValue(key));
+    };
+    if (auto* hinge = dynamic_cast<CHingeDialog*>(&model))
+        m_form->SetFindings([hinge] { return hinge->Findings(); });
+    m_view.build(*m_form, model);
+
+    m_scroll->setWidget(m_form);
+    m_scroll->setWidgetResizable(true);
+    m_scroll->setFrameShape(QFrame::NoFrame);
+    m_buttons->setStandardButtons(m_view.showsOnly
+                                      ? QDialogButtonBox::StandardButtons(QDialogButtonBox::Close)
+                                      : QDialogButtonBox::Ok | QDialogButtonBox::Cancel);
+    auto* layout = new QVBoxLayout(this);
+    layout->addWidget(m_scroll);
+    layout->addWidget(m_buttons);
+    connect(m_buttons, &QDialogButtonBox::accepted, this, &CDialogWindow::accept);
+    connect(m_buttons, &QDialogButtonBox::rejected, this, &QDialog::reject);
+    m_form->Refresh();
+    ShowTexts();
+}
+
+CDialogWindow::~CDialogWindow()
+{
+    m_model.SetView(m_before);
+}
+
+void CDialogWindow::accept()
+{
+    if (!m_form->Commit()) return;
+    if (m_model.OnOK()) {
+        QDialog::accept();
+        return;
+    }
+    m_form->Refresh();
+    m_form->ShowFirstMark();
+}
+
+void CDialogWindow::reject()
+{
+    if (!m_view.closes || m_view.closes(m_model)) QDialog::reject();
+}
+
+void CDialogWindow::ShowTexts()
+{
+    setWindowTitle(m_view.title ? QString::fromStdString(m_view.title()) : QString());
+    const auto name = [&](QDialogButtonBox::StandardButton which, const QString& text) {
+        if (QPushButton* button = m_buttons->button(which)) button->setText(text);
+    };
+    name(QDialogButtonBox::Ok,
+         m_view.accept ? QString::fromStdString(m_view.accept()) : Text("IDS_QM_UI_OK"));
+    name(QDialogButtonBox::Cancel, Text("IDS_QM_UI_CANCEL"));
+    name(QDialogButtonBox::Close, Text("IDS_QM_UI_CLOSE"));
+}
+
+void CDialogWindow::changeEvent(QEvent* event)
+{
+    QDialog::changeEvent(event);
+    if (event->type() == QEvent::LanguageChange) ShowTexts();
+}
+
+/// What the form needs without scrolling, within nine tenths of the screen.
+QSize CDialogWindow::WantedSize() const
+{
+    const QSize form = m_form->sizeHint();
+    const int bar = m_scroll->verticalScrollBarPolicy() == Qt::ScrollBarAlwaysOff ? 0 : 24;
+    const QSize need(form.width() + bar + 24, form.height() + m_buttons->sizeHint().height() + 36);
+    const QSize most = screen()->availableSize() * 9 / 10;
+    return need.expandedTo(m_view.size).boundedTo(most);
+}
+
+void CDialogWindow::showEvent(QShowEvent* event)
+{
+    resize(WantedSize());
+    QDialog::showEvent(event);
+}

@@ -1,0 +1,186 @@
+#include "qm_ui/frame/framelegend.h"
+
+#include "qm_base/msgfunction.h"
+#include "qm_base/textformat.h"
+#include "qm_ui/form/localnumber.h"
+#include "qm_ui/plot/plot.h"
+
+#include <QFont>
+#include <QFontMetricsF>
+#include <QPainter>
+
+#include <algorithm>
+#include <cmath>
+#include <functional>
+
+namespace {
+
+using zql::lib::MMSGFunction;
+
+constexpr double kPad = 8.0;
+constexpr double kSwatch = 26.0;
+constexpr double kTextPx = 12.0;
+constexpr double kDriftWidth = 190.0;
+
+QString Text(const char* key)
+{
+    return QString::fromStdString(MMSGFunction::GetValue(key));
+}
+
+bool HasKind(const T_FRAME_SCENE& scene, ELEM_KIND kind)
+{
+    return std::ranges::any_of(scene.lines, [&](const auto& l) { return l.kind == kind; });
+}
+
+struct T_ENTRY {
+    QString text;
+    std::function<void(QPainter&, QPointF middle)> swatch;
+};
+
+T_ENTRY LineEntry(const char* key, const QPen& pen)
+{
+    return {Text(key), [pen](QPainter& p, QPointF m) {
+                p.setPen(pen);
+                p.drawLine(m - QPointF(kSwatch / 2, 0), m + QPointF(kSwatch / 2, 0));
+            }};
+}
+
+std::vector<T_ENTRY> Entries(const T_FRAME_PICTURE& picture, const T_FRAME_OPTIONS& options)
+{
+    const T_FRAME_SCENE& scene = *picture.scene;
+    std::vector<T_ENTRY> out;
+    const std::pair<ELEM_KIND, const char*> kinds[] = {
+        {ELEM_KIND::Beam, "IDS_QM_UI_FRAME_BEAMS"},
+        {ELEM_KIND::Truss, "IDS_QM_UI_FRAME_TRUSSES"},
+        {ELEM_KIND::Link, "IDS_QM_UI_FRAME_LINKS"}};
+    for (const auto& [kind, key] : kinds)
+        if (HasKind(scene, kind)) out.push_back(LineEntry(key, FramePen(kind, false, true)));
+    if (picture.displacement && options.undeformed)
+        out.push_back(LineEntry("IDS_QM_UI_FRAME_BEFORE", FramePen(ELEM_KIND::Beam, true, true)));
+    if (options.supports)
+        out.push_back({Text("IDS_QM_UI_FRAME_SUPPORTS"), [](QPainter& p, QPointF m) {
+                           p.fillRect(QRectF(m.x() - 5, m.y() - 3, 10, 6), kSupportColor);
+                       }});
+    const bool hinged =
+        std::ranges::any_of(scene.lines, [](const auto& l) { return l.hingeI || l.hingeJ; });
+    if (options.hinges && hinged)
+        out.push_back({Text("IDS_QM_UI_FRAME_HINGES"), [](QPainter& p, QPointF m) {
+                           p.setPen(Qt::NoPen);
+                           p.setBrush(kHingeColor);
+                           p.drawEllipse(m, 3.0, 3.0);
+                           p.setBrush(Qt::NoBrush);
+                       }});
+    return out;
+}
+
+/// In lines from the bottom up; the height that they take.
+double DrawEntries(QPainter* painter, const QRectF& rect, const std::vector<T_ENTRY>& entries)
+{
+    const QFontMetricsF metrics(CPlot::Font(kTextPx, false));
+    const double line = metrics.height() + 4;
+    std::vector<std::vector<std::pair<double, const T_ENTRY*>>> rows(1);
+    double x = rect.left() + kPad;
+    for (const T_ENTRY& e : entries) {
+        const double w = kSwatch + 6 + metrics.horizontalAdvance(e.text) + 16;
+        if (x + w > rect.right() && !rows.back().empty()) {
+            rows.emplace_back();
+            x = rect.left() + kPad;
+        }
+        rows.back().emplace_back(x, &e);
+        x += w;
+    }
+    const double height = kPad / 2 + line * static_cast<double>(rows.size());
+    if (!painter) return height;
+    double y = rect.bottom() - height;
+    for (const auto& row : rows) {
+        for (const auto& [at, entry] : row) {
+            entry->swatch(*painter, {at + kSwatch / 2, y + line / 2});
+            painter->setPen(Qt::black);
+            painter->drawText(QRectF(at + kSwatch + 6, y, rect.right() - at, line),
+                              Qt::AlignLeft | Qt::AlignVCenter, entry->text);
+        }
+        y += line;
+    }
+    return height;
+}
+
+double DrawTitles(QPainter* painter, const QRectF& rect, const T_FRAME_PICTURE& picture)
+{
+    double y = rect.top() + kPad / 2;
+    const auto line = [&](const std::string& text, double px, bool bold) {
+        if (text.empty()) return;
+        const QFont font = CPlot::Font(px, bold);
+        const QFontMetricsF metrics(font);
+        if (painter) {
+            painter->setFont(font);
+            painter->setPen(Qt::black);
+            painter->drawText(
+                QRectF(rect.left() + kPad, y, rect.width() - 2 * kPad, metrics.height()),
+                Qt::AlignHCenter | Qt::AlignVCenter,
+                metrics.elidedText(QString::fromStdString(text), Qt::ElideRight,
+                                   rect.width() - 2 * kPad));
+        }
+        y += metrics.height() + 1;
+    };
+    line(picture.scene->title, 15.0, true);
+    line(picture.subtitle, 12.5, false);
+    line(picture.note, kTextPx, false);
+    if (painter) painter->setFont(CPlot::Font(kTextPx, false));
+    return y - rect.top();
+}
+
+/// Bars by storey, top storey first, in one scale with the largest one named.
+void DrawDrifts(QPainter& painter, const QRectF& rect, const std::vector<T_SCENE_DRIFT>& drifts)
+{
+    double largest = 0.0;
+    for (const T_SCENE_DRIFT& d : drifts)
+        largest = std::max(largest, std::fabs(d.drift));
+    const QFontMetricsF metrics(painter.font());
+    painter.setPen(Qt::black);
+    painter.drawText(QRectF(rect.left(), rect.top(), rect.width(), metrics.height()), Qt::AlignLeft,
+                     Text("IDS_QM_UI_FRAME_DRIFTS"));
+    const double row =
+        std::min((rect.height() - metrics.height() - kPad) / static_cast<double>(drifts.size()),
+                 3.0 * metrics.height());
+    double y = rect.top() + metrics.height() + kPad;
+    for (auto d = drifts.rbegin(); d != drifts.rend(); ++d, y += row) {
+        const double w = largest > 0 ? std::fabs(d->drift) / largest * rect.width() : 0.0;
+        painter.fillRect(QRectF(rect.left(), y + row * 0.55, w, row * 0.35),
+                         QColor(0x90, 0xca, 0xf9));
+        const QString text =
+            QString::fromStdString(d->name) + ": " + LocalNumberText(FormatText("%.3g", d->drift));
+        painter.drawText(QRectF(rect.left(), y, rect.width(), row * 0.55),
+                         Qt::AlignLeft | Qt::AlignBottom, text);
+    }
+}
+
+} // namespace
+
+QPen FramePen(ELEM_KIND kind, bool faint, bool thick)
+{
+    if (faint) return {QColor(0xb0, 0xb0, 0xb0), thick ? 1.0 : 0.0};
+    const double width = thick ? 1.6 : 0.0;
+    switch (kind) {
+    case ELEM_KIND::Truss:
+        return {QColor(0x00, 0x89, 0x7b), width};
+    case ELEM_KIND::Link:
+        return {QColor(0x8e, 0x24, 0xaa), width, Qt::DashLine};
+    default:
+        return {QColor(0x15, 0x4e, 0x8c), width};
+    }
+}
+
+QRectF DrawFrameLegend(QPainter* painter, const QRectF& rect, const T_FRAME_PICTURE& picture,
+                       const T_FRAME_OPTIONS& options)
+{
+    const double above = DrawTitles(painter, rect, picture);
+    const double below = DrawEntries(painter, rect, Entries(picture, options));
+    QRectF area = rect.adjusted(0, above, 0, -below);
+    if (options.drifts && !picture.drifts.empty() && area.width() > 2.5 * kDriftWidth) {
+        const QRectF side(area.right() - kDriftWidth, area.top() + kPad, kDriftWidth - kPad,
+                          area.height() - 2 * kPad);
+        if (painter) DrawDrifts(*painter, side, picture.drifts);
+        area.setRight(side.left() - kPad);
+    }
+    return area;
+}

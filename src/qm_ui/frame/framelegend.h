@@ -1,0 +1,18 @@
+// Titles, legend and drift bars around the picture of a frame.
+#pragma once
+
+#include "qm_ui/frame/framepainter.h"
+
+#include <QColor>
+#include <QPen>
+
+inline const QColor kSupportColor{0x37, 0x47, 0x4f};
+inline const QColor kHingeColor{0xef, 0x6c, 0x00};
+
+/// Pen of the lines of a kind of elements; faint: of the frame as it was.
+QPen FramePen(ELEM_KIND kind, bool faint, bool thick);
+
+/// Draws titles above, the legend below and drift bars at the right; returns what is left. Without
+/// a painter it only measures.
+QRectF DrawFrameLegend(QPainter* painter, const QRectF& rect, const T_FRAME_PICTURE& picture,
+                       const T_FRAME_OPTIONS& options);

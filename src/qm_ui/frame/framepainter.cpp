@@ -1,0 +1,246 @@
+#include "qm_ui/frame/framepainter.h"
+
+#include "qm_base/msgfunction.h"
+#include "qm_base/textformat.h"
+#include "qm_ui/frame/framelegend.h"
+#include "qm_ui/plot/plot.h"
+
+#include <QColor>
+#include <QFont>
+#include <QFontMetricsF>
+#include <QPainter>
+#include <QPolygonF>
+
+#include <algorithm>
+#include <array>
+#include <cmath>
+#include <limits>
+#include <numbers>
+#include <set>
+#include <utility>
+
+namespace {
+
+constexpr double kMargin = 28.0;
+constexpr double kHit = 10.0;
+constexpr std::size_t kSmooth = 4000; // members up to which lines are smoothed
+constexpr double kCell = 34.0;        // px between numbers that are drawn
+
+using KIND = ELEM_KIND;
+constexpr std::array<KIND, 3> kKinds{KIND::Beam, KIND::Truss, KIND::Link};
+
+/// Axes of the page in space.
+struct T_AXES {
+    std::array<double, 3> right{}, up{};
+};
+
+T_AXES AxesOf(const T_CAMERA& camera)
+{
+    constexpr double kRad = std::numbers::pi / 180.0;
+    const double sy = std::sin(camera.yawDeg * kRad), cy = std::cos(camera.yawDeg * kRad);
+    const double sp = std::sin(camera.pitchDeg * kRad), cp = std::cos(camera.pitchDeg * kRad);
+    return {{cy, sy, 0.0}, {-sy * sp, cy * sp, cp}};
+}
+
+double Dot(const std::array<double, 3>& a, const std::array<double, 3>& b)
+{
+    return a[0] * b[0] + a[1] * b[1] + a[2] * b[2];
+}
+
+/// The three axes in the lower left corner.
+void DrawTriad(QPainter& painter, const QRectF& area, const T_AXES& axes)
+{
+    constexpr double kLength = 28.0;
+    const std::array<std::pair<const char*, QColor>, 3> names{{{"X", QColor(0xc6, 0x28, 0x28)},
+                                                               {"Y", QColor(0x2e, 0x7d, 0x32)},
+                                                               {"Z", QColor(0x15, 0x65, 0xc0)}}};
+    const QPointF from = area.bottomLeft() + QPointF(14, -30);
+    for (std::size_t d = 0; d < 3; ++d) {
+        const QPointF tip = from + kLength * QPointF(axes.right[d], -axes.up[d]);
+        if (QLineF(from, tip).length() < 3.0) continue; // it points at the viewer
+        painter.setPen(QPen(names[d].second, 1.5));
+        painter.drawLine(from, tip);
+        painter.drawText(tip + 0.25 * (tip - from) + QPointF(-4, 4), names[d].first);
+    }
+}
+
+} // namespace
+
+/// Node places on the page. The frame without displacements fits at zoom 1.
+void CFramePainter::PlaceDesign(const T_FRAME_PICTURE& picture, const T_CAMERA& camera,
+                                const QRectF& area)
+{
+    const auto& nodes = picture.scene->nodes;
+    const T_AXES axes = AxesOf(camera);
+    m_design.resize(nodes.size());
+    constexpr double kFar = std::numeric_limits<double>::infinity();
+    double left = kFar, right = -kFar, low = kFar, high = -kFar;
+    for (std::size_t n = 0; n < nodes.size(); ++n) {
+        const double x = Dot(nodes[n].xyz, axes.right), y = Dot(nodes[n].xyz, axes.up);
+        m_design[n] = {x, y};
+        left = std::min(left, x);
+        right = std::max(right, x);
+        low = std::min(low, y);
+        high = std::max(high, y);
+    }
+    const double w = std::max(right - left, 1e-12), h = std::max(high - low, 1e-12);
+    const double px = camera.zoom * std::min(std::max(area.width() - 2 * kMargin, 10.0) / w,
+                                             std::max(area.height() - 2 * kMargin, 10.0) / h);
+    const QPointF centre = area.center() + camera.pan;
+    const double cx = 0.5 * (left + right), cy = 0.5 * (low + high);
+    for (QPointF& p : m_design)
+        p = {centre.x() + px * (p.x() - cx), centre.y() - px * (p.y() - cy)};
+    m_pxPerLength = px;
+}
+
+void CFramePainter::PlaceMoved(const T_FRAME_PICTURE& picture, const T_CAMERA& camera)
+{
+    const auto& nodes = picture.scene->nodes;
+    const T_AXES axes = AxesOf(camera);
+    m_moved = m_design;
+    if (!picture.displacement || picture.displacement->size() != nodes.size()) return;
+    for (std::size_t n = 0; n < nodes.size(); ++n) {
+        const auto& move = (*picture.displacement)[n];
+        m_moved[n] +=
+            m_pxPerLength * picture.scale * QPointF(Dot(move, axes.right), -Dot(move, axes.up));
+    }
+}
+
+void CFramePainter::DrawLines(QPainter& painter, const T_FRAME_SCENE& scene,
+                              const std::vector<QPointF>& at, bool faint)
+{
+    for (const KIND kind : kKinds) {
+        m_lines.clear();
+        for (const T_SCENE_LINE& line : scene.lines)
+            if (line.kind == kind) m_lines.emplace_back(at[line.i], at[line.j]);
+        if (m_lines.empty()) continue;
+        painter.setPen(FramePen(kind, faint, scene.lines.size() <= kSmooth));
+        painter.drawLines(m_lines.data(), static_cast<int>(m_lines.size()));
+    }
+}
+
+/// Of a model without elements, whose results came from another solver.
+void CFramePainter::DrawNodes(QPainter& painter) const
+{
+    constexpr double kRadius = 3.0;
+    painter.setPen(Qt::NoPen);
+    painter.setBrush(FramePen(KIND::Beam, false, true).color());
+    for (const QPointF p : m_moved)
+        painter.drawEllipse(p, kRadius, kRadius);
+    painter.setBrush(Qt::NoBrush);
+}
+
+/// A triangle under a node that is held from moving, a square where it can't turn either.
+void CFramePainter::DrawSupports(QPainter& painter, const T_FRAME_SCENE& scene) const
+{
+    painter.setPen(QPen(kSupportColor, 1.2));
+    painter.setBrush(kSupportColor.lighter(160));
+    for (std::size_t n = 0; n < scene.nodes.size(); ++n) {
+        const T_DIRS6& held = scene.nodes[n].held;
+        if (!held[0] && !held[1] && !held[2]) continue;
+        const QPointF p = m_design[n];
+        if (held[3] || held[4] || held[5])
+            painter.drawRect(QRectF(p.x() - 5, p.y(), 10, 6));
+        else
+            painter.drawPolygon(QPolygonF{{p, p + QPointF(-5, 8), p + QPointF(5, 8)}});
+    }
+    painter.setBrush(Qt::NoBrush);
+}
+
+void CFramePainter::DrawHinges(QPainter& painter, const T_FRAME_SCENE& scene) const
+{
+    constexpr double kRadius = 2.8, kFromEnd = 0.08;
+    painter.setPen(Qt::NoPen);
+    painter.setBrush(kHingeColor);
+    for (const T_SCENE_LINE& line : scene.lines) {
+        const QPointF i = m_moved[line.i], j = m_moved[line.j];
+        if (line.hingeI) painter.drawEllipse(i + kFromEnd * (j - i), kRadius, kRadius);
+        if (line.hingeJ) painter.drawEllipse(j + kFromEnd * (i - j), kRadius, kRadius);
+    }
+    painter.setBrush(Qt::NoBrush);
+}
+
+/// Where numbers would cover one another only the first of a cell is drawn.
+void CFramePainter::DrawNumbers(QPainter& painter, const QRectF& area,
+                                const T_FRAME_PICTURE& picture,
+                                const T_FRAME_OPTIONS& options) const
+{
+    std::set<std::pair<long, long>> taken;
+    const auto draw = [&](QPointF at, int id, const QColor& color) {
+        if (!area.contains(at)) return;
+        if (!taken.emplace(std::lround(at.x() / kCell), std::lround(at.y() / (kCell / 2))).second)
+            return;
+        painter.setPen(color);
+        painter.drawText(at + QPointF(4, -4), QString::number(id));
+    };
+    if (options.nodeNumbers)
+        for (std::size_t n = 0; n < m_moved.size(); ++n)
+            draw(m_moved[n], picture.scene->nodes[n].id, QColor(0x4a, 0x14, 0x8c));
+    if (options.elementNumbers)
+        for (const T_SCENE_LINE& line : picture.scene->lines)
+            draw(0.5 * (m_moved[line.i] + m_moved[line.j]), line.id, QColor(0x00, 0x60, 0x64));
+}
+
+void CFramePainter::DrawBackground(QPainter& painter, const QRectF& rect,
+                                   const T_FRAME_PICTURE& picture, const T_CAMERA& camera,
+                                   const T_FRAME_OPTIONS& options)
+{
+    painter.fillRect(rect, Qt::white);
+    if (!picture.scene || picture.scene->nodes.empty()) return;
+    const T_FRAME_SCENE& scene = *picture.scene;
+    painter.save();
+    painter.setClipRect(rect);
+    PlaceDesign(picture, camera, DrawFrameLegend(nullptr, rect, picture, options));
+    painter.setRenderHint(QPainter::Antialiasing, scene.lines.size() <= kSmooth);
+    if (picture.displacement && options.undeformed) DrawLines(painter, scene, m_design, true);
+    painter.setRenderHint(QPainter::Antialiasing, true);
+    if (options.supports) DrawSupports(painter, scene);
+    painter.restore();
+}
+
+void CFramePainter::DrawForeground(QPainter& painter, const QRectF& rect,
+                                   const T_FRAME_PICTURE& picture, const T_CAMERA& camera,
+                                   const T_FRAME_OPTIONS& options)
+{
+    if (!picture.scene) return;
+    const T_FRAME_SCENE& scene = *picture.scene;
+    painter.save();
+    painter.setClipRect(rect);
+    const QRectF area = DrawFrameLegend(&painter, rect, picture, options);
+    if (scene.nodes.empty()) {
+        painter.drawText(
+            area, Qt::AlignCenter,
+            QString::fromStdString(zql::lib::MMSGFunction::GetValue("IDS_QM_UI_FRAME_EMPTY")));
+        painter.restore();
+        return;
+    }
+    PlaceMoved(picture, camera);
+    painter.setRenderHint(QPainter::Antialiasing, scene.lines.size() <= kSmooth);
+    DrawLines(painter, scene, m_moved, false);
+    painter.setRenderHint(QPainter::Antialiasing, true);
+    if (scene.lines.empty()) DrawNodes(painter);
+    if (options.hinges) DrawHinges(painter, scene);
+    if (options.nodeNumbers || options.elementNumbers) DrawNumbers(painter, area, picture, options);
+    DrawTriad(painter, area, AxesOf(camera));
+    painter.restore();
+}
+
+void CFramePainter::Draw(QPainter& painter, const QRectF& rect, const T_FRAME_PICTURE& picture,
+                         const T_CAMERA& camera, const T_FRAME_OPTIONS& options)
+{
+    DrawBackground(painter, rect, picture, camera, options);
+    DrawForeground(painter, rect, picture, camera, options);
+}
+
+long CFramePainter::NodeAt(QPointF place) const
+{
+    long nearest = -1;
+    double distance = kHit;
+    for (std::size_t n = 0; n < m_moved.size(); ++n) {
+        const double d = QLineF(place, m_moved[n]).length();
+        if (d >= distance) continue;
+        distance = d;
+        nearest = static_cast<long>(n);
+    }
+    return nearest;
+}

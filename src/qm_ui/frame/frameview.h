@@ -1,0 +1,61 @@
+// The frame in a window: rotate, zoom, pan, read-out of the node under the mouse.
+#pragma once
+
+#include "qm_ui/frame/framepainter.h"
+
+#include <QPixmap>
+#include <QPoint>
+#include <QWidget>
+
+/// Left drag turns, right or middle drag (or left with Shift) moves, the wheel zooms at the cursor,
+/// a double click fits. Arrow keys turn, + and - zoom, 0 fits; 1 to 4 isometric, XZ, YZ, XY.
+class CFrameView : public QWidget {
+public:
+    explicit CFrameView(QWidget* parent = nullptr);
+
+    /// The picture's scene must stay until another one is set.
+    void SetPicture(T_FRAME_PICTURE picture);
+    const T_FRAME_PICTURE& Picture() const { return m_picture; }
+    void SetCamera(const T_CAMERA& camera);
+    const T_CAMERA& Camera() const { return m_camera; }
+    void SetOptions(const T_FRAME_OPTIONS& options);
+    const T_FRAME_OPTIONS& Options() const { return m_options; }
+    /// Id and coordinates of the node under a place; empty: none.
+    [[nodiscard]] QString ReadOut(QPointF place) const;
+
+    QSize sizeHint() const override { return {720, 520}; }
+    QSize minimumSizeHint() const override { return {240, 180}; }
+
+protected:
+    void paintEvent(QPaintEvent* event) override;
+    void mousePressEvent(QMouseEvent* event) override;
+    void mouseMoveEvent(QMouseEvent* event) override;
+    void mouseDoubleClickEvent(QMouseEvent* event) override;
+    void wheelEvent(QWheelEvent* event) override;
+    void keyPressEvent(QKeyEvent* event) override;
+
+private:
+    void ZoomAt(QPointF place, double factor);
+    void Turn(double yawDeg, double pitchDeg);
+
+    T_FRAME_PICTURE m_picture;
+    T_CAMERA m_camera;
+    T_FRAME_OPTIONS m_options;
+    CFramePainter m_painter;
+    /// What the background at hand was drawn for; another picture of the same frame keeps it.
+    struct T_KEPT {
+        const T_FRAME_SCENE* scene = nullptr;
+        long revision = 0;
+        bool moved = false;
+        std::size_t lines = 0; // titles that are shown: they move the frame
+        bool drifts = false;
+        T_CAMERA camera;
+        T_FRAME_OPTIONS options;
+        QSize size;
+        bool operator==(const T_KEPT&) const = default;
+    };
+    T_KEPT Key() const;
+    T_KEPT m_kept;
+    QPixmap m_background;
+    QPointF m_grab;
+};

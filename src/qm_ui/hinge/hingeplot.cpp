@@ -1,0 +1,113 @@
+#include "qm_ui/hinge/hingeplot.h"
+
+#include "qm_rps/hinge/hingepreview.h"
+
+#include <array>
+
+namespace {
+
+constexpr T_PLOT_COLOR kBlack{0, 0, 0}, kRed{184, 40, 30};
+
+struct T_CURVE_ROW {
+    const char* name;
+    const T_YIELD_AXIS T_YIELD_LEVEL::*axis;
+    const T_PM_CURVE T_SIDES<T_PM_CURVE>::*side;
+    PLOT_LINE line;
+};
+
+constexpr std::array<T_CURVE_ROW, 4> kCurves{{
+    {"My(+)", &T_YIELD_LEVEL::y, &T_SIDES<T_PM_CURVE>::pos, PLOT_LINE::Solid},
+    {"My(-)", &T_YIELD_LEVEL::y, &T_SIDES<T_PM_CURVE>::neg, PLOT_LINE::Dash},
+    {"Mz(+)", &T_YIELD_LEVEL::z, &T_SIDES<T_PM_CURVE>::pos, PLOT_LINE::DashDot},
+    {"Mz(-)", &T_YIELD_LEVEL::z, &T_SIDES<T_PM_CURVE>::neg, PLOT_LINE::Dot},
+}};
+
+} // namespace
+
+T_PLOT HingeBackbonePlot(const T_PHGT_D& type, HINGE_COMPONENT component, const T_SKEL_CURVE& curve,
+                         const std::string& page)
+{
+    const auto c = static_cast<std::size_t>(component);
+    const bool moment = component >= HINGE_COMPONENT::Mx;
+    T_PLOT plot;
+    plot.title = "Hinge type " + type.name + ", " + kComponentNames[c];
+    plot.subtitle = page;
+    T_HINGE_PREVIEW preview;
+    if (!BackboneOf(curve, type.components[c].type, preview)) {
+        plot.notes.push_back("The curve has no shape yet: strengths or deformations are missing.");
+        return plot;
+    }
+    plot.x.title = preview.plasticAxis
+                       ? std::string("Plastic deformation") + (moment ? " (rad)" : " (length)")
+                       : std::string("D / Dy (-)");
+    plot.y.title = moment ? "M / My (-)" : "F / Fy (-)";
+    T_PLOT_SERIES line;
+    line.name = "Backbone";
+    line.width = 2.4;
+    line.color = kBlack;
+    line.line = PLOT_LINE::Solid;
+    line.marker = PLOT_MARKER::Circle;
+    for (const T_PREVIEW_POINT& p : preview.line) {
+        line.x.push_back(p.x);
+        line.y.push_back(p.y);
+        plot.labels.push_back({p.x, p.y, p.label, PLOT_MARKER::None, true});
+    }
+    plot.series.push_back(std::move(line));
+    T_PLOT_SERIES marks;
+    marks.name = "Acceptance criteria";
+    marks.line = PLOT_LINE::None;
+    marks.marker = PLOT_MARKER::Triangle;
+    marks.color = kRed;
+    for (const T_PREVIEW_POINT& p : preview.marks) {
+        marks.x.push_back(p.x);
+        marks.y.push_back(p.y);
+        plot.labels.push_back({p.x, p.y, p.label, PLOT_MARKER::None, false});
+    }
+    if (!marks.x.empty()) plot.series.push_back(std::move(marks));
+    if (preview.schematicGap) plot.notes.push_back("The gap is drawn to no scale.");
+    return plot;
+}
+
+T_PLOT HingeInteractionPlot(const T_PHGT_D& type, const T_YIELD_LEVEL& level,
+                            const std::string& what)
+{
+    T_PLOT plot;
+    plot.title = "Hinge type " + type.name + ", interaction";
+    plot.subtitle = what;
+    plot.x.title = "M / MY,max (-)";
+    plot.y.title = "P / Pmax, compression positive (-)";
+    for (const T_CURVE_ROW& row : kCurves) {
+        const T_YIELD_AXIS& axis = level.*row.axis;
+        if (!axis.used) continue;
+        T_PLOT_SERIES s;
+        s.name = row.name;
+        s.line = row.line;
+        s.marker = PLOT_MARKER::Circle;
+        for (const T_PM_POINT& p : axis.curves.*row.side) {
+            s.x.push_back(p.m);
+            s.y.push_back(p.p);
+        }
+        plot.series.push_back(std::move(s));
+    }
+    return plot;
+}
+
+T_PLOT UserInteractionPlot(const T_PHGT_D& type, const T_PMM_TABLE& table)
+{
+    T_PLOT plot;
+    plot.title = "Hinge type " + type.name + ", interaction of the user";
+    plot.x.title = "M / Mmax (-)";
+    plot.y.title = "P / Pmax, compression positive (-)";
+    for (std::size_t i = 0; i < table.curves.size(); ++i) {
+        T_PLOT_SERIES s;
+        s.name = i == 0 ? "Py-My" : "Pz-Mz";
+        s.line = i == 0 ? PLOT_LINE::Solid : PLOT_LINE::Dash;
+        s.marker = PLOT_MARKER::Circle;
+        for (const T_PM_POINT& p : table.curves[i]) {
+            s.x.push_back(p.m);
+            s.y.push_back(p.p);
+        }
+        plot.series.push_back(std::move(s));
+    }
+    return plot;
+}

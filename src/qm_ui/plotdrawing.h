@@ -1,8 +1,0 @@
-// A plot as a drawing, for files and printers.
-#pragma once
-
-#include "qm_ui/picturefile.h"
-#include "qm_ui/plotdata.h"
-
-/// 960 px wide and as high as the plot says. It keeps a reference to the plot.
-[[nodiscard]] T_DRAWING DrawingOf(const T_PLOT& plot);

@@ -1,0 +1,15 @@
+// The picture of an evaluation: capacity and demand spectra in ADRS with what the method found.
+#pragma once
+
+#include "qm_rps/pushover/pushevaluation.h"
+#include "qm_ui/plot/plotdata.h"
+
+/// Capacity, elastic demand, reduced demand, locus, trials, performance point or limit states,
+/// initial-stiffness and effective-period lines, with units, legend and results below.
+T_PLOT EvaluationPlot(const T_PUSH_EVALUATION& e);
+
+// Parts that other pictures of an evaluation share.
+std::string PlotStepText(int step);
+std::string PlotSubtitle(const T_PUSH_EVALUATION& e);
+/// The results below the picture.
+void AddEvaluationNotes(T_PLOT& plot, const T_PUSH_EVALUATION& e);

@@ -1,0 +1,16 @@
+// Views of the pushover curve window and its dialogs.
+#pragma once
+
+#include "qm_ui/form/viewfactory.h"
+
+class CPushOverComparisonDlg;
+class CPushOverCurveDampParamUser;
+class CPushOverCurveEdit;
+class CPushOverTextDlg;
+
+/// The window: settings left, picture, trials, results and commands right.
+void BuildPushOverCurve(CFormView& form, CPushOverCurveEdit& model);
+void BuildUserDamping(CFormView& form, CPushOverCurveDampParamUser& model);
+/// Preview of a text with a button that saves it.
+void BuildPushOverText(CFormView& form, CPushOverTextDlg& model);
+void BuildPushOverComparison(CFormView& form, CPushOverComparisonDlg& model);

@@ -1,6 +1,0 @@
-// Windows of the constraints of unknown load factors: their list, one of them.
-#pragma once
-
-#include "qm_ui/ulfviewparts.h"
-
-void RegisterUlfConstraintViews(CViewFactory& factory);

@@ -1,6 +1,0 @@
-// Windows of the unknown load factor items: their list, a static item, one of construction stages.
-#pragma once
-
-#include "qm_ui/ulfviewparts.h"
-
-void RegisterUlfItemViews(CViewFactory& factory, const T_ULF_HOOKS& hooks);

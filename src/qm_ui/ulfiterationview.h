@@ -1,6 +1,0 @@
-// Windows of the iterative analysis for pretension: settings, run, result between iterations.
-#pragma once
-
-#include "qm_ui/ulfviewparts.h"
-
-void RegisterUlfIterationViews(CViewFactory& factory);

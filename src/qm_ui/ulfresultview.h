@@ -1,6 +1,0 @@
-// Windows of the result of unknown load factors and of its explanation.
-#pragma once
-
-#include "qm_ui/ulfviewparts.h"
-
-void RegisterUlfResultViews(CViewFactory& factory, const T_ULF_HOOKS& hooks);

@@ -1,7 +1,0 @@
-#include "qm_ui/viewfactory.h"
-
-const T_VIEW* CViewFactory::Find(const zql::frx::MDialog& model) const
-{
-    const auto it = m_views.find(typeid(model));
-    return it == m_views.end() ? nullptr : &it->second;
-}

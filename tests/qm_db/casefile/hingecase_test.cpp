@@ -1,0 +1,223 @@
+// Hinges, and what they refer to, in the case file and in the model file.
+#include "casetext.h"
+#include "qm_base/msgfunction.h"
+#include "qm_db/records/hingetype.h"
+#include "qm_db/store/sqlitedb.h"
+
+#include <gtest/gtest.h>
+#include <limits>
+
+namespace {
+
+const std::string kData = QM_TEST_DATA;
+
+std::string RichText()
+{
+    return CaseText("hinge_all_members.json");
+}
+
+T_HINGE_COMPONENT& Component(T_MODEL_CONTENT& content, HINGE_COMPONENT c)
+{
+    return content.model.hingeTypes.at(1).components[static_cast<std::size_t>(c)];
+}
+
+T_SKEL_FEMA& FemaI(T_MODEL_CONTENT& content)
+{
+    return std::get<T_SKEL_FEMA>(Component(content, HINGE_COMPONENT::My).curves.I);
+}
+
+} // namespace
+
+TEST(HingeCase, TheTextOfEveryMemberComesBackLetterForLetter)
+{
+    const T_MODEL_CONTENT content = ParseGood(RichText());
+    EXPECT_EQ(RichText(), PrintGood(content));
+    ExpectRoundTrips(content, "rich");
+}
+
+// 1 in = 0.0254 m, 1 kip = 4448.2216152605 N.
+TEST(HingeCase, ReadsMembersIntoTheirFieldsInSi)
+{
+    T_MODEL_CONTENT content = ParseGood(RichText());
+    const T_MODEL& m = content.model;
+    constexpr double kip = 4448.2216152605, in = 0.0254;
+    EXPECT_DOUBLE_EQ(29000 * kip / in / in, m.materials.at(1).E);
+    EXPECT_EQ(MATL_CLASS::Concrete, m.materials.at(3).type); // its stated key
+    EXPECT_DOUBLE_EQ(284 * in * in * in * in, m.sections.at(1).Iyy);
+    EXPECT_DOUBLE_EQ(1.56 * in * in, m.sections.at(2).bars[1].area);
+
+    const T_SKEL_FEMA& my = FemaI(content); // a curvature hinge: 1 / length
+    EXPECT_DOUBLE_EQ(1200 * kip * in, my.sides.pos.yield);
+    EXPECT_DOUBLE_EQ(-0.0002 / in, my.sides.neg.yieldDeform);
+    EXPECT_DOUBLE_EQ(3e6 * kip * in * in, my.sides.pos.userStiffness);
+    const auto& other = std::get<T_SKEL_FEMA>(Component(content, HINGE_COMPONENT::My).curves.J);
+    EXPECT_EQ(1.0, other.sides.pos.B.deform); // D / Dy
+    const T_HINGE_COMPONENT& fx = Component(content, HINGE_COMPONENT::Fx);
+    EXPECT_EQ(0.001, std::get<T_SKEL_MULTI>(fx.curves.I).sides.pos.D1); // a strain
+
+    const T_PHGT_D& type = m.hingeTypes.at(1);
+    EXPECT_DOUBLE_EQ(210 * kip * in, type.yieldSurface->crack->y.momentMax.neg);
+    EXPECT_EQ((std::array<double, 6>{7 * in, 8 * in, 0, 0, 0, 0}), type.length.components.J);
+    EXPECT_DOUBLE_EQ(0.1 * kip / in / in, type.masonry->shearStrength);
+    EXPECT_EQ(0.1, m.hingeTypes.at(5).length.My.I); // a fraction of the member length
+    EXPECT_DOUBLE_EQ(0.5 * in, m.inelasticHinges.at(1).components[1]->sides.pos.C.deform);
+
+    const T_POLC_D& run = m.pushovers.at(1);
+    EXPECT_EQ((T_POLC_CONTROL{0, 2, 1, 0.1, true, 2.5, false, -4 * in, 8 * in}), *run.control);
+}
+
+TEST(HingeCase, EveryChoiceOfEveryListComesBack)
+{
+    T_MODEL_CONTENT content = ParseGood(RichText());
+    for (int i = 0; i < 7; ++i) {
+        T_PHGT_D& type = content.model.hingeTypes.at(1);
+        content.model.materials.at(1).type = static_cast<MATL_CLASS>(i % 4);
+        content.model.sections.at(1).shape = static_cast<SECT_SHAPE>(i % 6);
+        type.element = static_cast<HINGE_ELEMENT>(i);
+        type.definition = static_cast<HINGE_DEFINITION>(i % 3);
+        type.interaction = static_cast<HINGE_INTERACTION>(i % 5);
+        type.material = static_cast<MATL_CLASS>(i % 4);
+        T_SKEL_FEMA& fema = FemaI(content);
+        fema.measure = static_cast<SKEL_MEASURE>(i % 2);
+        fema.initStiffness = static_cast<INIT_STIFFNESS>(i % 5);
+        fema.unloadType = static_cast<UNLOAD_TYPE>(i % 5);
+        T_HINGE_COMPONENT& fz = Component(content, HINGE_COMPONENT::Fz);
+        fz.type = static_cast<SKEL_TYPE>(i);
+        fz.location = static_cast<HINGE_LOCATION>(1 + i % 4);
+        fz.active = i % 2 == 0;
+        fz.sameEnds = i % 3 == 0;
+        fz.curves = {MakeSkelCurve(fz.type), MakeSkelCurve(fz.type)};
+        if (auto* multi = std::get_if<T_SKEL_MULTI>(&fz.curves.I)) {
+            multi->gapSides = static_cast<GAP_SIDES>(i % 3);
+            multi->sides.neg.P1 = i;
+        }
+        ExpectRoundTrips(content, std::to_string(i));
+    }
+}
+
+TEST(HingeCase, IsLosslessInEveryUnit)
+{
+    ExpectLosslessInEveryUnit(ParseGood(RichText()));
+}
+
+TEST(HingeCase, BadInputNamesThePlace)
+{
+    // clang-format off
+    const T_SPOILT rows[] = {
+        {"design_codes", "concrete", "conc", "design_codes: unknown key \"conc\""},
+        {"\"materials\"", "\"C30\"", "\"A992\"", "materials[1].name: \"A992\" appears twice"},
+        {"\"materials\"", "\"key\": 3", "\"key\": 1", "materials[1].key: keys must rise, from 1"},
+        {"\"materials\"", "29000", "1e308", "materials[0].E: a value is too large"},
+        {"\"sections\"", "0.3, 0.5]", "0.3, 0.5, 1]", "sections[0].size: 5 values, expected up to 4"},
+        {"\"elements\"", "\"id\": 7", "\"id\": 4", "elements[1].id: element 4 appears twice"},
+        {"\"elements\"", "[2, 3]", "[2, 5]", "elements[1].nodes[1]: there is no such node"},
+        {"\"elements\"", "\"section\": \"R\"", "\"section\": \"Q\"", "elements[1].section: there is no such section"},
+        {"hinge_types", "\"section\": 2", "\"section\": 9", "hinge_types[0].section: there is no such section"},
+        {"hinge_types", "\"degrading slip\"", "\"slip\"", "hinge_types[0].components.My.I.unload_type: unknown unloading type \"slip\"; allowed: origin, nonlinear elastic, bilinear, stiffness degrading, degrading slip"},
+        {"hinge_types", "\"type\": \"FEMA\",", "", "hinge_types[0].components.My: \"type\" is missing"},
+        {"hinge_types", "1, 0.5, 0.25, 0.125", "null", "hinge_types[0].components.My.I.positive.energy[0]: expected a number, found null"},
+        {"yield_surface", "[1, 0.8,", "[1,", "hinge_types[0].yield_surface.yield.y.positive.p: 9 values, expected 10"},
+        {"\"hinges\"", "\"hinge_type\": 1", "\"hinge_type\": 2", "hinges[0].hinge_type: there is no such hinge type"},
+        {"\"pushover\"", "\"force\"", "\"push\"", "pushover[0].control.increment_method: unknown increment method \"push\"; allowed: force, displacement"},
+    };
+    // clang-format on
+    ExpectRefused(RichText(), rows);
+}
+
+TEST(HingeCase, RefusesToStoreWhatCouldNotBeRead)
+{
+    const struct {
+        const char* caseText;
+        const char* storeText; // after the table and the key
+        void (*spoil)(T_MODEL_CONTENT&);
+    } rows[] = {
+        {"hinge_types[0].components.My.I.positive.yield: the value is not a finite number",
+         "hinge_types 1 components.My.I.positive.yield: the value is not a finite number",
+         [](T_MODEL_CONTENT& c) {
+             FemaI(c).sides.pos.yield = std::numeric_limits<double>::quiet_NaN();
+         }},
+        {"hinge_types[0].components.Mx: a curve is not of the component's type",
+         "hinge_types 1 components.Mx: a curve is not of the component's type",
+         [](T_MODEL_CONTENT& c) { Component(c, HINGE_COMPONENT::Mx).type = SKEL_TYPE::Ec8; }},
+        {"hinge_types[0].definition: no name for the value 3",
+         "hinge_types 1 definition: no name for the value 3",
+         [](T_MODEL_CONTENT& c) {
+             c.model.hingeTypes.at(1).definition = static_cast<HINGE_DEFINITION>(3);
+         }},
+        {"materials[1].name: the name appears twice", nullptr,
+         [](T_MODEL_CONTENT& c) { c.model.materials.at(3).name = "A992"; }},
+    };
+    const CTempFolder folder;
+    for (const auto& row : rows) {
+        T_MODEL_CONTENT content = ParseGood(RichText());
+        row.spoil(content);
+        std::string text;
+        T_FILE_ERROR error;
+        EXPECT_EQ(0, CCaseFile::Print(content, text, error)) << row.caseText;
+        EXPECT_EQ(0U, error.text.find(row.caseText)) << error.text;
+        if (!row.storeText) continue;
+        const std::string path = folder.File("bad.qmdb");
+        EXPECT_EQ(0, CModelStore().Save(path, content, error)) << row.storeText;
+        EXPECT_EQ(
+            zql::lib::MMSGFunction::Format("IDS_QM_DB_FILE_BAD_RECORD", {path, row.storeText}),
+            error.text);
+        EXPECT_TRUE(folder.Names().empty());
+    }
+}
+
+// The file was written by the program when it knew version 1 only, out of all_members.json.
+TEST(HingeCase, AFileOfVersion1OpensAndIsSavedAsTheCurrentVersion)
+{
+    const CTempFolder folder;
+    const std::string path = folder.File("model.qmdb");
+    WriteBytes(path, BytesOf(kData + "/model-v1.qmdb"));
+    ASSERT_EQ(1, BytesOf(path)[63]); // user_version, last byte
+    T_MODEL_CONTENT source, content, again;
+    T_FILE_ERROR error;
+    ASSERT_EQ(1, CCaseFile::Read(kData + "/cases/all_members.json", source, error)) << error.text;
+    CModelStore store;
+    ASSERT_EQ(1, store.Open(path, OPEN_MODE::Edit, content, error)) << error.text;
+    EXPECT_TRUE(SameContent(source, content));
+
+    const T_MODEL rich = ParseGood(RichText()).model; // and takes what version 1 could not hold
+    content.model.hingeTypes = rich.hingeTypes;
+    content.model.materials = rich.materials;
+    content.model.pushovers.at(1).control = T_POLC_CONTROL{};
+    content.model.styp.gsd = true;
+    ASSERT_EQ(1, store.Save(path, content, error)) << error.text;
+    EXPECT_EQ(4, BytesOf(path)[63]);
+    ASSERT_EQ(1, CModelStore::CheckWhole(path, error)) << error.text;
+    ASSERT_EQ(1, CModelStore().Open(path, OPEN_MODE::ReadOnly, again, error)) << error.text;
+    EXPECT_TRUE(SameContent(content, again));
+}
+
+// Files written by the program when it knew version 2: the case file and its model file.
+TEST(HingeCase, FilesWithOlderKeysAndOfVersion2HoldTheSameModel)
+{
+    T_MODEL_CONTENT now = ParseGood(RichText());
+    for (auto& [key, type] : now.model.hingeTypes) { // what version 2 did not know
+        type.fibreSection = type.thicknessSection = 0;
+        for (T_HINGE_COMPONENT& c : type.components)
+            for (T_SKEL_CURVE* curve : {&c.curves.I, &c.curves.J})
+                if (auto* fema = std::get_if<T_SKEL_FEMA>(curve)) fema->compliance = true;
+    }
+    T_MODEL_CONTENT text, content, again;
+    T_FILE_ERROR error;
+    ASSERT_EQ(1, CCaseFile::Read(kData + "/cases/hinge_old_keys.json", text, error)) << error.text;
+    EXPECT_TRUE(SameContent(now, text));
+
+    const CTempFolder folder;
+    const std::string path = folder.File("model.qmdb");
+    WriteBytes(path, BytesOf(kData + "/model-v2.qmdb"));
+    ASSERT_EQ(2, BytesOf(path)[63]);
+    CModelStore store;
+    ASSERT_EQ(1, store.Open(path, OPEN_MODE::Edit, content, error)) << error.text;
+    EXPECT_TRUE(SameContent(now, content));
+    content.model.loadCases[1] = {"G", {0, 0, -1}, {}, {}, {}, {}, {}};
+    content.model.styp.plane = MODEL_PLANE::XZ;
+    content.model.elements.at(4).release.I[4] = true;
+    ASSERT_EQ(1, store.Save(path, content, error)) << error.text;
+    EXPECT_EQ(4, BytesOf(path)[63]);
+    ASSERT_EQ(1, CModelStore().Open(path, OPEN_MODE::ReadOnly, again, error)) << error.text;
+    EXPECT_TRUE(SameContent(content, again));
+}

@@ -1,0 +1,184 @@
+#include "qm_db/file/recorderfile.h"
+
+#include "qm_db/casefile.h"
+
+#include <filesystem>
+#include <fstream>
+#include <gtest/gtest.h>
+#include <unistd.h>
+
+namespace {
+
+std::vector<double> ColumnOf(const std::string& text, int column, int skipRows = 0)
+{
+    CRecorderFile file;
+    file.Parse(text, "r.out", skipRows);
+    std::vector<double> values(file.RowCount(), 0.0);
+    T_FILE_ERROR error;
+    EXPECT_EQ(1, file.AddColumn(column, values, error)) << error.text;
+    return values;
+}
+
+using T_V = std::vector<double>;
+
+TEST(RecorderFile, ReadsEverySeparatorAndLineEnd)
+{
+    const char* const texts[] = {
+        "1 2 3\n4 5 6\n",
+        "1\t2\t3\r\n4\t5\t6\r\n",
+        "1,2,3\n4,5,6",
+        " 1, 2 ,3\n\n4 5,\t6,\n",
+        "# solver 1\n+1 2e0 3\n4 5. 6\n",
+        "t  a  b\n1 2 3\n4 5 6\n",
+        "time, Disp X, \"Disp Y\"\n1,2,3\n4,5,6\n",
+    };
+    for (const char* text : texts) {
+        EXPECT_EQ((T_V{1, 4}), ColumnOf(text, 1)) << text;
+        EXPECT_EQ((T_V{2, 5}), ColumnOf(text, 2)) << text;
+        EXPECT_EQ((T_V{3, 6}), ColumnOf(text, 3)) << text;
+    }
+    EXPECT_EQ((T_V{2, 6}), ColumnOf("1,,2\n4,,6\n", 3)); // an empty cell keeps its column
+}
+
+TEST(RecorderFile, NamesFileLineAndColumnOfABadCell)
+{
+    struct T_ROW {
+        const char* text;
+        int column;
+        const char* message;
+    };
+    const T_ROW rows[] = {
+        {"1 2\n\n3 x\n4 y\n", 2, "r.out: line 3, column 2: \"x\" is not a finite number"},
+        {"1 2\n3 nan\n", 2, "r.out: line 2, column 2: \"nan\" is not a finite number"},
+        {"nan nan\n", 1, "r.out: line 1, column 1: \"nan\" is not a finite number"}, // no header
+        {"1 1e999\n", 2, "r.out: line 1, column 2: \"1e999\" is not a finite number"},
+        {"1,,3\n", 2, "r.out: line 1, column 2: \"\" is not a finite number"},
+        {"1 1.0D+05\n", 2, "r.out: line 1, column 2: \"1.0D+05\" is not a finite number"},
+        {"1 2\n3\n", 2, "r.out: line 2, column 2: missing, the row has 1 columns"},
+    };
+    for (const T_ROW& row : rows) {
+        CRecorderFile file;
+        file.Parse(row.text, "r.out", 0);
+        T_V values(file.RowCount(), 7.0);
+        const T_V before = values;
+        T_FILE_ERROR error;
+        EXPECT_EQ(0, file.AddColumn(row.column, values, error)) << row.text;
+        EXPECT_EQ(row.message, error.text);
+        EXPECT_EQ(before, values);
+    }
+}
+
+/// Case files that take their steps from tables in a folder of the test.
+class RecorderCase : public testing::Test {
+protected:
+    RecorderCase() : m_folder(testing::TempDir() + "recorderfile_test_" + std::to_string(getpid()))
+    {
+        std::filesystem::create_directories(m_folder + "/sub");
+        Put("d.out", "0 9 0.001 -3\n1 9 0.011 7\n2 9 0.031 5\n");
+        Put("sub/v.csv", "t,V1,V2\n0,1,2\n1,-5,-10\n2,-6,-20\n");
+        Put("short.out", "0 1\n1 2\n");
+        Put("bad.out", "0 1\n1 oops\n2 3\n");
+    }
+    ~RecorderCase() override { std::filesystem::remove_all(m_folder); }
+    void Put(const std::string& name, const std::string& text) const
+    {
+        std::ofstream(m_folder + "/" + name) << text;
+    }
+
+    /// A case in mm whose "files" has these members.
+    int Parse(const std::string& files)
+    {
+        const std::string text =
+            "{\"format\": \"qm-rps case 1\", \"units\": {\"force\": \"kN\", \"length\": \"mm\"},"
+            "\"nodes\": [{\"id\": 1, \"xyz\": [0,0,0]}, {\"id\": 2, \"xyz\": [0,0,1]}],"
+            "\"pushover\": [{\"name\": \"P\", \"control_node\": 2, \"direction\": \"DX\","
+            "\"pattern\": {\"kind\": \"static\"}, \"steps\": {\"files\": {" +
+            files + "}}}]}";
+        m_content = {};
+        m_error = {};
+        const int done = CCaseFile::Parse(text, "case.json", m_folder, m_content, m_error);
+        EXPECT_EQ(done, static_cast<int>(m_error.text.empty())) << m_error.text;
+        EXPECT_EQ(done, static_cast<int>(m_content.model.nodes.size()) / 2);
+        return done;
+    }
+    T_PUSH_DATA Result()
+    {
+        T_PUSH_DATA data;
+        std::string error;
+        EXPECT_EQ(1, ReadWholeResult(*m_content.results.at(1), data, error));
+        return data;
+    }
+
+    std::string m_folder;
+    T_MODEL_CONTENT m_content;
+    T_FILE_ERROR m_error;
+};
+
+const std::string kFactor = "\"load_factor\": {\"path\": \"d.out\", \"column\": 1},";
+const std::string kForce = "\"base_reaction\": {\"path\": \"sub/v.csv\", \"columns\": [2, \"V2\"], "
+                           "\"scale\": -1},";
+const std::string kDisp = "\"displacement\": {\"2\": {\"path\": \"d.out\", \"column\": 3}, "
+                          "\"1\": {\"path\": \"d.out\", \"column\": 4, \"scale\": 0.5}}";
+
+TEST_F(RecorderCase, SubtractsTheStateBeforeThePush)
+{
+    ASSERT_EQ(1, Parse("\"first_row\": \"state before push\", " + kFactor + kForce + kDisp));
+    const T_PUSH_DATA data = Result();
+    EXPECT_EQ((T_V{1, 2}), data.loadFactor);
+    // -(V1 + V2): -3, 15, 26 kN; without the first row 18 and 29 kN
+    EXPECT_EQ((T_V{18e3, 29e3}), data.baseReaction);
+    ASSERT_EQ(2U, data.displacement.size());
+    EXPECT_NEAR(0.010e-3, data.displacement.at(2)[0], 1e-18);
+    EXPECT_NEAR(0.030e-3, data.displacement.at(2)[1], 1e-18);
+    EXPECT_EQ((T_V{5e-3, 4e-3}), data.displacement.at(1)); // half of 10 and 8 mm
+}
+
+TEST_F(RecorderCase, RefusesBadTablesWithFileLineAndColumn)
+{
+    struct T_ROW {
+        std::string files;
+        const char* message; // after "case.json: pushover[0].steps.files"
+    };
+    const std::string head = kFactor + kForce;
+    const auto disp = [&](const char* source) {
+        return head + "\"displacement\": {\"2\": " + source + "}";
+    };
+    const T_ROW rows[] = {
+        {kForce + kDisp, ": \"load_factor\" is missing"},
+        {"\"skip_rows\": -1, " + head + kDisp, ".skip_rows: the number of rows can't be negative"},
+        {"\"first_row\": \"zero\", " + head + kDisp,
+         ".first_row: unknown first row \"zero\"; allowed: state before push"},
+        {disp("{\"path\": \"d.out\", \"column\": 1, \"columns\": [1]}"),
+         ".displacement.\"2\": expected either \"column\" or \"columns\""},
+        {disp("{\"path\": \"d.out\", \"column\": 0}"),
+         ".displacement.\"2\".column: columns count from 1"},
+        {disp("{\"path\": \"d.out\", \"column\": 5}"),
+         ".displacement.\"2\".column: d.out: line 1, column 5: missing, the row has 4 columns"},
+        {disp("{\"path\": \"d.out\", \"columns\": [1, \"Y\"]}"),
+         ".displacement.\"2\".columns[1]: d.out: no header line with the column \"Y\""},
+        {disp("{\"path\": \"bad.out\", \"column\": 2}"),
+         ".displacement.\"2\".column: bad.out: line 2, column 2: \"oops\" is not a finite number"},
+        {disp("{\"path\": \"short.out\", \"column\": 2}"),
+         ".displacement.\"2\": short.out: 2 rows up to line 2, expected 3 as in d.out"},
+        {disp("{\"path\": \"d.out\", \"column\": 2, \"scale\": 0}"),
+         ".displacement: a curve of zero displacement: the control node 2 never moves"},
+        {"\"skip_rows\": 3, " + kFactor + kForce + kDisp, ".load_factor: there is no step"},
+    };
+    for (const T_ROW& row : rows) {
+        EXPECT_EQ(0, Parse(row.files));
+        EXPECT_EQ(FILE_FAULT::BadInput, m_error.fault);
+        EXPECT_EQ("case.json: pushover[0].steps.files" + std::string(row.message), m_error.text);
+    }
+}
+
+TEST_F(RecorderCase, ReportsATableThatIsNotThere)
+{
+    EXPECT_EQ(0,
+              Parse("\"load_factor\": {\"path\": \"none.out\", \"column\": 1}," + kForce + kDisp));
+    EXPECT_EQ(FILE_FAULT::NoAccess, m_error.fault);
+    EXPECT_EQ("case.json: pushover[0].steps.files.load_factor: " + m_folder +
+                  "/none.out: can't open: No such file or directory",
+              m_error.text);
+}
+
+} // namespace

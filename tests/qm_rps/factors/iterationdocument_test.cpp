@@ -1,0 +1,146 @@
+// The iterative analysis of a real document.
+#include "iterationperson.h"
+#include "qm_db/filectrl.h"
+#include "qm_rps/factors/ulfiterationdochost.h"
+#include "qm_rps/factors/ulfstageresults.h"
+#include "twotrusses.h"
+
+#include <filesystem>
+
+namespace {
+
+class UlfIterationDocument : public testing::Test {
+protected:
+    UlfIterationDocument()
+    {
+        m_folder = testing::TempDir() + "qm_iterdoc_" +
+                   testing::UnitTest::GetInstance()->current_test_info()->name();
+        std::filesystem::remove_all(m_folder);
+        std::filesystem::create_directory(m_folder);
+    }
+    std::string Report() const
+    {
+        std::string text;
+        T_FILE_ERROR error;
+        return CFileCtrl::ReadWholeFile(m_folder + "/frame.ulf", text, error) ? text : "none";
+    }
+
+    std::string m_folder;
+    CPerson m_person;
+};
+
+} // namespace
+
+TEST_F(UlfIterationDocument, LeavesTheLoadsWhenOneOfThemCannotBeChanged)
+{
+    T_MODEL_CONTENT content = two::Content();
+    content.model.loadCases[2].pretension.push_back({9, 1.0}); // there is no such element
+    CDBDoc doc;
+    doc.Data().Assign(std::move(content));
+    CUlfStageResults results(doc);
+    CUnknownStageItemDlg dialog(doc, results, 1);
+    CUlfIterationDocHost host(doc, dialog, nullptr);
+    (void)dialog.OnCalculate(); // forms the problem; without results there are no factors
+    ASSERT_EQ(1, host.StartEdit("scale"));
+    EXPECT_EQ(0, host.ScalePretension(0, 2.0));
+    EXPECT_NE(std::string::npos, host.Error().find('9'));
+    host.CancelEdit();
+    EXPECT_EQ(1.0, doc.Data().Model().loadCases.at(2).pretension.at(0).force);
+    EXPECT_FALSE(doc.Undo().CanUndo());
+}
+
+TEST_F(UlfIterationDocument, BringsATwoTrussFrameToItsTensionInOneIteration)
+{
+    CDBDoc doc;
+    doc.Data().Assign(two::Content());
+    T_FILE_ERROR error;
+    ASSERT_EQ(1, doc.SaveAs(m_folder + "/frame.qmdb", error)) << error.text;
+    T_ANALYSIS_OPTIONS options;
+    options.allCases = false;
+    T_ANALYSIS_ERROR fault;
+    ASSERT_EQ(1, doc.RunAnalysis(options, fault)) << fault.text;
+    CUlfStageResults results(doc);
+    CUnknownStageItemDlg dialog(doc, results, 1);
+    CUlfIterationDocHost host(doc, dialog, &m_person);
+    CUlfIteration run(host, {});
+    dialog.SetView(&m_person);
+    ASSERT_EQ(1, dialog.OnIterate(run)) << host.Error();
+    EXPECT_EQ(ULF_ITER_END::Converged, run.End());
+    ASSERT_EQ(2U, run.History().size());
+    EXPECT_EQ("S1/First Step", run.History()[0].rows.at(0).place);
+    EXPECT_NEAR(4.0, run.History()[0].rows.at(0).factor, 1e-12); // T = 4 holds G
+    EXPECT_NEAR(1.0, run.History()[1].rows.at(0).factor, 1e-12);
+    EXPECT_GT(m_person.m_events, 0);
+    T_DOF6 u{};
+    doc.Post().SelectStage(1, kStageFirstStep, kStageLoadSum);
+    ASSERT_EQ(1, doc.Post().GetDspcNew(2, u));
+    EXPECT_NEAR(0.0, u[0], 1e-12);
+    // The copy on disk has the new tension with its results, the model itself the old one.
+    for (const auto& [name, force] :
+         {std::pair{"/frame.qmdb", 1.0}, std::pair{"/frame_01.qmdb", 4.0}}) {
+        CDBDoc other;
+        ASSERT_EQ(1, other.OpenModel(m_folder + name, OPEN_MODE::ReadOnly, error)) << error.text;
+        EXPECT_NEAR(force, other.Data().Model().loadCases.at(2).pretension.at(0).force, 1e-12);
+        EXPECT_EQ(force > 1, other.IsPostMode()) << name;
+    }
+    // One command of the person takes the change back.
+    EXPECT_EQ("Change load values for iterative analysis", doc.Undo().UndoTitle());
+    ASSERT_EQ(1, doc.Undo().Undo());
+    EXPECT_EQ(1.0, doc.Data().Model().loadCases.at(2).pretension.at(0).force);
+}
+
+// The two trusses of twotrusses.h with the tension that they had, whatever ends the analysis.
+TEST_F(UlfIterationDocument, LeavesTheDocumentAsAfterTheLastIterationWhenAnAnalysisEndsEarly)
+{
+    for (const bool cancel : {true, false}) {
+        CDBDoc doc;
+        doc.Data().Assign(two::Content());
+        T_FILE_ERROR error;
+        ASSERT_EQ(1, doc.SaveAs(m_folder + "/frame.qmdb", error)) << error.text;
+        T_ANALYSIS_OPTIONS options;
+        options.allCases = false;
+        T_ANALYSIS_ERROR fault;
+        ASSERT_EQ(1, doc.RunAnalysis(options, fault)) << fault.text;
+        CUlfStageResults results(doc);
+        CUnknownStageItemDlg dialog(doc, results, 1);
+        CUlfIterationDocHost host(doc, dialog, &m_person);
+        CUlfIteration run(host, {});
+        dialog.SetView(&m_person);
+        m_person.m_overwrite = true;
+        double whileRunning = 0.0;
+        bool asked = false;
+        m_person.m_onEvents = [&] {
+            EXPECT_TRUE(doc.IsExcuted());
+            EXPECT_FALSE(doc.Edit().Begin("meanwhile"));
+            EXPECT_EQ(0, doc.Undo().Undo());
+            whileRunning = doc.Data().Model().loadCases.at(2).pretension.at(0).force;
+            asked = cancel;
+            if (cancel)
+                doc.CancelAnalysis();
+            else
+                std::filesystem::remove_all(m_folder); // its results can't be saved
+        };
+        run.m_progress = [&](int, int) { return !asked; };
+        EXPECT_EQ(0, dialog.OnIterate(run));
+        EXPECT_EQ(cancel ? ULF_ITER_END::Cancelled : ULF_ITER_END::NotAnalysed, run.End());
+        EXPECT_NEAR(4.0, whileRunning, 1e-12);
+        EXPECT_EQ(1.0, doc.Data().Model().loadCases.at(2).pretension.at(0).force);
+        EXPECT_EQ(1U, run.History().size());
+        EXPECT_FALSE(doc.IsExcuted());
+        EXPECT_TRUE(doc.IsPostMode()) << doc.Post().Error(); // with the results of that tension
+        T_DOF6 u{};
+        doc.Post().SelectStage(1, kStageFirstStep, kStageLoadSum);
+        ASSERT_EQ(1, doc.Post().GetDspcNew(2, u)) << doc.Post().Error();
+        EXPECT_NEAR(3.0 / 20, u[0], 1e-12);
+        EXPECT_FALSE(doc.Undo().CanUndo());
+        if (!cancel) continue;
+        EXPECT_EQ("", host.Error());
+        EXPECT_NE(std::string::npos, Report().find("Iteration = 0"));
+        EXPECT_EQ(std::string::npos, Report().find("Iteration = 1"));
+        CDBDoc other; // the file has them too
+        ASSERT_EQ(1, other.OpenModel(doc.Path(), OPEN_MODE::ReadOnly, error)) << error.text;
+        EXPECT_EQ(doc.Data().Model(), other.Data().Model());
+        EXPECT_TRUE(other.IsPostMode()) << other.Post().Error();
+        EXPECT_FALSE(doc.Data().IsModified());
+    }
+}

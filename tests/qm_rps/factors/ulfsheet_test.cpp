@@ -1,0 +1,196 @@
+#include "qm_rps/factors/ulfcombination.h"
+#include "qm_rps/factors/ulfsheet.h"
+
+#include <gtest/gtest.h>
+
+namespace {
+
+T_ULF_RESULT Result(std::size_t cases, std::size_t constraints)
+{
+    T_ULF_RESULT r;
+    for (std::size_t j = 0; j < cases; ++j) {
+        r.cases.push_back({static_cast<int>(j) + 1, "L" + std::to_string(j + 1), 1.0});
+        r.factors.push_back(0.5 * static_cast<double>(j + 1));
+    }
+    for (std::size_t i = 0; i < constraints; ++i) {
+        r.constraints.push_back({"C" + std::to_string(i + 1), "", {}, {}});
+        r.influence.emplace_back(cases, 1.0 + static_cast<double>(i));
+    }
+    return r;
+}
+
+const T_SHEET_CELL& At(const T_SHEET& sheet, const std::string& address)
+{
+    static const T_SHEET_CELL none;
+    for (const auto& [at, cell] : sheet.cells)
+        if (SheetAddress(at.first, at.second) == address) return cell;
+    return none;
+}
+
+} // namespace
+
+TEST(UlfSheet, HoldsEveryCell)
+{
+    T_ULF_RESULT r = Result(2, 2); // factors 0.5, 1; influence 1 1 and 2 2
+    r.constraints[0].upper = 3;
+    r.constraints[0].lower = -3;
+    r.constraints[1].lower = 1;
+    r.influence[1] = {2, -4};
+    T_SHEET s;
+    ASSERT_EQ(1, MakeUlfSheet(r, {16, 2024, 2, 9, "frame.qmdb"}, s));
+    using V = SHEET_VALUE;
+    const std::pair<const char*, V> kCells[] = {
+        {"A2", "UnknownLoad Factor Result (Influence Matrix)"},
+        {"A4", "File Name : "},
+        {"B4", "frame.qmdb"},
+        {"D4", "Date : 2024/2/9"},
+        {"A5", "Number of Constraints : 2"},
+        {"D5", "Number of Load Cases : 2"},
+        {"B8", "Constraint"},
+        {"B9", "Upper Bound"},
+        {"B10", "Lower Bound"},
+        {"B11", "Value"},
+        {"A9", "Factor"},
+        {"C8", "C1"},
+        {"D8", "C2"},
+        {"C9", 3.0},
+        {"C10", -3.0},
+        {"D9", V{}},
+        {"D10", 1.0},
+        {"A12", "L1"},
+        {"A13", "L2"},
+        {"B12", 0.5},
+        {"B13", 1.0},
+        {"C12", 1.0},
+        {"C13", 1.0},
+        {"D12", 2.0},
+        {"D13", -4.0},
+        {"C11", T_SHEET_FORMULA{"=SUMPRODUCT(B12:B13,C12:C13)", 1.5}},
+        {"D11", T_SHEET_FORMULA{"=SUMPRODUCT(B12:B13,D12:D13)", -3.0}},
+    };
+    std::size_t filled = 0;
+    for (const auto& [address, value] : kCells)
+        EXPECT_EQ(value, At(s, address).value) << address;
+    for (const auto& [at, cell] : s.cells)
+        filled += cell.value != V{};
+    EXPECT_EQ(std::size(kCells) - 1, filled); // nothing else; D9 is empty
+    for (const char* centred : {"B8", "B9", "B10", "B11", "A9", "C8", "D8", "A12", "A13"})
+        EXPECT_TRUE(At(s, centred).style.centred) << centred;
+    for (const char* plain : {"A2", "A4", "C9", "B12", "C12", "C11"})
+        EXPECT_FALSE(At(s, plain).style.centred) << plain;
+}
+
+TEST(UlfSheet, DrawsItsFrame)
+{
+    T_SHEET s;
+    ASSERT_EQ(1, MakeUlfSheet(Result(2, 2), {}, s)); // block A8:D13
+    using E = SHEET_EDGE;
+    const struct {
+        const char* address;
+        E left, right, top, bottom;
+    } kCells[] = {
+        {"A8", E::Thin, E::None, E::Thin, E::None},
+        {"D8", E::None, E::Thin, E::Thin, E::None},
+        {"A13", E::Thin, E::None, E::None, E::Thin},
+        {"D13", E::None, E::Thin, E::None, E::Thin},
+        {"A11", E::Thin, E::None, E::None, E::Double},
+        {"D11", E::None, E::Thin, E::None, E::Double},
+        {"B8", E::None, E::Double, E::Thin, E::None},
+        {"B13", E::None, E::Double, E::None, E::Thin},
+        {"B11", E::None, E::Double, E::None, E::Double},
+        {"C12", E::None, E::None, E::None, E::None},
+    };
+    for (const auto& c : kCells) {
+        const T_SHEET_STYLE& style = At(s, c.address).style;
+        EXPECT_TRUE(style.left == c.left && style.right == c.right && style.top == c.top &&
+                    style.bottom == c.bottom)
+            << c.address;
+    }
+}
+
+TEST(UlfSheet, AppendsTheConstantAsItIsShown)
+{
+    T_ULF_RESULT r = Result(2, 2);
+    r.constraints[0].constant = 1.23456789;
+    r.constraints[1].constant = -2.0;
+    T_SHEET s;
+    ASSERT_EQ(1, MakeUlfSheet(r, {}, s));
+    const auto first = std::get<T_SHEET_FORMULA>(At(s, "C11").value);
+    EXPECT_EQ("=SUMPRODUCT(B12:B13,C12:C13)+1.234568", first.text);
+    EXPECT_DOUBLE_EQ(1.5 + 1.234568, first.value);
+    EXPECT_EQ((T_SHEET_FORMULA{"=SUMPRODUCT(B12:B13,D12:D13)+-2.000000", 1.0}),
+              std::get<T_SHEET_FORMULA>(At(s, "D11").value));
+}
+
+TEST(UlfSheet, NamesColumnsBeyondZ)
+{
+    T_SHEET s;
+    ASSERT_EQ(1, MakeUlfSheet(Result(1, 16382), {}, s));
+    const std::pair<std::size_t, const char*> kColumns[] = {
+        {2, "C"}, {25, "Z"}, {26, "AA"}, {51, "AZ"}, {701, "ZZ"}, {702, "AAA"}, {16383, "XFD"}};
+    for (const auto& [column, letters] : kColumns) {
+        const std::string x = letters;
+        EXPECT_EQ("=SUMPRODUCT(B12:B12," + x + "12:" + x + "12)",
+                  std::get<T_SHEET_FORMULA>(s.cells.at({10, column}).value).text);
+        EXPECT_EQ(SHEET_VALUE("C" + std::to_string(column - 1)), s.cells.at({7, column}).value);
+    }
+    EXPECT_EQ(SHEET_EDGE::Thin, At(s, "XFD12").style.right);
+}
+
+TEST(UlfSheet, RefusesMoreConstraintsThanColumns)
+{
+    const struct {
+        int version;
+        std::size_t constraints;
+        bool fits;
+    } kCases[] = {
+        {11, 230, true},    {11, 231, false},  {12, 231, true},    {12, 16385, false},
+        {16, 16385, false}, {16, 16382, true}, {16, 16383, false}, // beyond the last column of the
+                                                                   // sheet, XFD
+    };
+    for (const auto& c : kCases)
+        EXPECT_EQ(c.fits, UlfSheetFits(c.constraints, c.version))
+            << c.version << " " << c.constraints;
+    T_SHEET s;
+    s.name = "before";
+    EXPECT_EQ(0, MakeUlfSheet(Result(1, 231), {11, 0, 0, 0, {}}, s));
+    EXPECT_EQ("before", s.name);
+    EXPECT_TRUE(s.cells.empty());
+}
+
+TEST(UlfCombination, ReplacesInOneAndMultipliesInSeveral)
+{
+    const auto plan = [](int n) {
+        T_LCOM_D flat{"base", {}};
+        std::map<int, double> factors;
+        for (int key = 1; key <= n; ++key) {
+            flat.items.push_back({false, key, 2.0});
+            factors[key] = key;
+        }
+        return PlanUlfCombinations("frame", flat, factors);
+    };
+    const struct {
+        int entries;
+        bool split;
+        std::vector<std::size_t> sizes;
+        double second; // factor of the second entry: 2 replaced, or 2 * 2
+    } kCases[] = {
+        {998, false, {998}, 2.0},
+        {999, true, {999, 0}, 4.0}, // the empty one is meant
+        {1000, true, {999, 1}, 4.0},
+        {1998, true, {999, 999, 0}, 4.0},
+    };
+    for (const auto& c : kCases) {
+        const T_ULF_COMBINATION_PLAN p = plan(c.entries);
+        EXPECT_EQ(c.split, p.split) << c.entries;
+        ASSERT_EQ(c.sizes.size(), p.parts.size()) << c.entries;
+        for (std::size_t i = 0; i < c.sizes.size(); ++i) {
+            EXPECT_EQ(c.sizes[i], p.parts[i].items.size()) << c.entries;
+            EXPECT_EQ(c.split ? "frame-" + std::to_string(i + 1) : "frame", p.parts[i].name);
+        }
+        EXPECT_EQ((T_LCOM_ITEM{false, 2, c.second}), p.parts[0].items[1]) << c.entries;
+        if (c.entries == 1000) {
+            EXPECT_EQ((T_LCOM_ITEM{false, 1000, 2000.0}), p.parts[1].items[0]);
+        }
+    }
+}

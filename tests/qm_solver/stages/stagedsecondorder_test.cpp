@@ -1,0 +1,476 @@
+// Axial forces and cable sag, against closed forms and equations solved by bisection.
+#include "staged.h"
+
+#include "qm_solver/element/cablesag.h"
+#include "qm_solver/element/spanload.h"
+
+#include <cmath>
+#include <functional>
+
+namespace {
+
+using namespace sample;
+
+constexpr auto kBeam = ELEMENT_KIND::Beam;
+constexpr auto kTruss = ELEMENT_KIND::Truss;
+constexpr double kE = 2.1e8, kA = 5.4e-3, kIy = 3.7e-5, kEA = kE * kA, kEI = kE * kIy;
+
+double Root(const std::function<double(double)>& f, double low, double high)
+{
+    for (int k = 0; k < 200; ++k) {
+        const double middle = 0.5 * (low + high);
+        ((f(middle) > 0) == (f(high) > 0) ? high : low) = middle;
+    }
+    return 0.5 * (low + high);
+}
+
+// ---- geometric stiffness ------------------------------------------------------------------------
+
+constexpr double kHeight = 6.0;
+
+/// Column along Z in equal pieces, free in the plane X-Z, clamped at the foot.
+T_STAGED_MODEL Column(std::size_t pieces)
+{
+    T_FRAME frame = Empty();
+    for (std::size_t i = 0; i <= pieces; ++i) {
+        AddNode(frame, {0, 0, kHeight * double(i) / double(pieces)});
+        Fix(frame, i, {1, 3, 5});
+        if (i > 0) Join(frame, kBeam, i - 1, i);
+    }
+    FixAll(frame, 0);
+    T_STAGED_MODEL model = OneStage(frame, 2);
+    model.options.geometricStiffness = true;
+    for (T_ELEMENT& e : model.frame.elements)
+        e.zAxis = {0, 1, 0}; // bends about local z, whose inertia is Iz
+    model.frame.sections[0].Iz = kIy;
+    return model;
+}
+
+std::vector<T_LOAD_CASE> Push(std::size_t top, double p, double h)
+{
+    std::vector<T_LOAD_CASE> cases(2);
+    cases[0].nodal.push_back({top, {0, 0, -p, 0, 0, 0}});
+    cases[1].nodal.push_back({top, {h, 0, 0, 0, 0, 0}});
+    return cases;
+}
+
+TEST(StagedSecondOrder, ACantileverColumnFollowsTheTangent)
+{
+    // delta = H / P (tan kL / k - L), moment at x: H sin k(L - x) / (k cos kL), k2 = P / EI.
+    const std::size_t pieces = 16;
+    const double h = 3.0, critical = kEI * std::pow(std::acos(-1.0) / (2 * kHeight), 2);
+    for (const double share : {0.2, 0.5, 0.8}) {
+        const double p = share * critical, k = std::sqrt(p / kEI), kl = k * kHeight;
+        CStagedSolver staged;
+        Build(staged, Column(pieces), Push(pieces, p, h));
+        T_RESULT r;
+        ASSERT_TRUE(staged.ReadSum(0, kLastStep, STAGE_SUM::All, r));
+        const double tip = h / p * (std::tan(kl) / k - kHeight);
+        EXPECT_NEAR(tip, r.displacement[pieces][0], 1e-6 * tip) << share;
+        const double foot = h * std::tan(kl) / k;
+        EXPECT_NEAR(foot, std::fabs(r.reaction[0][4]), 1e-6 * foot);
+        EXPECT_NEAR(-h, r.reaction[0][0], 1e-9 * h);
+        for (const std::size_t piece : {0, 7})
+            for (std::size_t at = 0; at < kBeamPositions; ++at) {
+                const double x = kHeight * (double(piece) + 0.25 * double(at)) / double(pieces);
+                EXPECT_NEAR(h * std::sin(k * (kHeight - x)) / (k * std::cos(kl)),
+                            std::fabs(r.force[piece][at][5]), 2e-5 * foot)
+                    << share << " " << piece << " " << at;
+            }
+        // The push gives all the bending, the load alone none: given N the cases superpose.
+        EXPECT_NEAR(tip, Case(staged, 0, 1).displacement[pieces][0], 1e-6 * tip);
+        EXPECT_NEAR(0, Case(staged, 0, 0).displacement[pieces][0], 1e-12);
+    }
+}
+
+TEST(StagedSecondOrder, OnePieceBalancesWithAHingeAndShearDeformation)
+{
+    // Base moment = H L + P delta whatever the shape, also where the column is one flexible piece.
+    T_STAGED_MODEL model = Column(1);
+    model.frame.sections[0].Asy = 1e-3;
+    model.frame.elements[0].releaseJ[5] = true;
+    model.stages[0].activateSupports[1] = {1, {false, true, false, true, true, true}};
+    CStagedSolver staged;
+    Build(staged, model, Push(1, 100.0, 3.0));
+    T_RESULT r;
+    ASSERT_TRUE(staged.ReadSum(0, kLastStep, STAGE_SUM::All, r));
+    const double delta = r.displacement[1][0];
+    EXPECT_GT(delta, 3.0 * 216 / (3 * kEI));
+    EXPECT_NEAR(3.0 * kHeight + 100.0 * delta, std::fabs(r.force[0][0][5]), 1e-9);
+    EXPECT_NEAR(0, r.force[0][4][5], 1e-9); // at the hinge, summed up from the foot
+}
+
+TEST(StagedSecondOrder, AColumnBeyondItsLoadBuckles)
+{
+    // Euler's load PE of the cantilever; with shear deformation PE / (1 + PE / G As) (Engesser).
+    const double euler = kEI * std::pow(std::acos(-1.0) / (2 * kHeight), 2);
+    const double shearArea = 2 * euler / 8.1e7;
+    for (const bool shear : {false, true})
+        for (const bool above : {false, true}) {
+            T_STAGED_MODEL model = Column(8);
+            if (shear) model.frame.sections[0].Asy = shearArea;
+            CStagedSolver staged;
+            T_SOLVER_ERROR error;
+            ASSERT_TRUE(staged.Prepare(model, error));
+            const double critical = shear ? euler / 1.5 : euler;
+            const int done = staged.Run(Push(8, (above ? 1.01 : 0.99) * critical, 0.0), error);
+            EXPECT_EQ(above ? 0 : 1, done) << shear;
+            if (!above) continue;
+            EXPECT_EQ(SOLVER_FAULT::Mechanism, error.fault);
+            EXPECT_EQ(0, error.stage);
+            EXPECT_NE(std::string::npos, error.reason.find("buckles"));
+        }
+}
+
+TEST(StagedSecondOrder, GeometricStiffnessIsTheIntegralOfSlopes)
+{
+    // Slopes of the deflections by differences, the integral by the midpoint rule.
+    const T_BEAM_SHAPE shape{3.0, 2.0, 0.7};
+    T_MATRIX12 k{}, sum{};
+    AddGeometricStiffness(shape, 5.0, k);
+    const std::size_t parts = 3000;
+    const double dx = shape.length / double(parts);
+    for (std::size_t p = 0; p < parts; ++p) {
+        std::array<std::array<double, 2>, 12> slope;
+        for (std::size_t i = 0; i < 12; ++i) {
+            T_VEC12 unit{};
+            unit[i] = 1.0;
+            const auto a = DeflectionAt(shape, dx * double(p), unit),
+                       b = DeflectionAt(shape, dx * double(p + 1), unit);
+            slope[i] = {(b[0] - a[0]) / dx, (b[1] - a[1]) / dx};
+        }
+        for (std::size_t i = 0; i < 12; ++i)
+            for (std::size_t j = 0; j < 12; ++j)
+                sum[i][j] += 5.0 * dx * (slope[i][0] * slope[j][0] + slope[i][1] * slope[j][1]);
+    }
+    for (std::size_t i = 0; i < 12; ++i)
+        for (std::size_t j = 0; j < 12; ++j)
+            EXPECT_NEAR(sum[i][j], k[i][j], 1e-5) << i << " " << j;
+}
+
+TEST(StagedSecondOrder, AHingeInTheBeamIsAHingeAtItsSupport)
+{
+    // A beam with a load on its span and a compression: hinged by releases at ends that do not
+    // turn, and without releases at ends that do.
+    T_RESULT r[2];
+    for (const bool released : {false, true}) {
+        T_FRAME frame = Empty();
+        AddNode(frame, {0, 0, 0});
+        AddNode(frame, {5, 0, 0});
+        Join(frame, kBeam, 0, 1);
+        FixAll(frame, 0);
+        Fix(frame, 1, {1, 2, 3, 4, 5});
+        for (const std::size_t n : {0, 1})
+            frame.nodes[n].fixed[4] = released;
+        frame.elements[0].releaseI[4] = frame.elements[0].releaseJ[4] = released;
+        T_LOAD_CASE load;
+        load.nodal.push_back({1, {-800, 0, 0, 0, 0, 0}});
+        load.beam.push_back({0, BEAM_LOAD::Distributed, true, 2, {-3, -5}, {0.1, 0.8}});
+        T_STAGED_MODEL model = OneStage(frame, 1);
+        model.options.geometricStiffness = true;
+        CStagedSolver staged;
+        Build(staged, model, {load});
+        r[released] = Case(staged, 0, 0);
+    }
+    for (std::size_t at = 0; at < kBeamPositions; ++at)
+        for (std::size_t k = 0; k < 6; ++k)
+            EXPECT_NEAR(r[0].force[0][at][k], r[1].force[0][at][k], 1e-9) << at << " " << k;
+    EXPECT_NEAR(0, r[1].force[0][4][4], 1e-9);
+    // Both hinges turn by the load, so that the compression adds to the moment at mid-span.
+    const double w = 0.5 * 0.7 * 5 * 8;
+    EXPECT_GT(std::fabs(r[1].force[0][2][4]), 1.3 * w * 5 / 8);
+}
+
+TEST(StagedSecondOrder, ATightStringStiffensAcrossItself)
+{
+    // Two strings of 5 with tension T: a load across gives P L / 2T; without T it is a mechanism.
+    T_FRAME frame = Empty();
+    for (const double x : {0.0, 5.0, 10.0})
+        AddNode(frame, {x, 0, 0});
+    for (const std::size_t n : {0, 1, 2})
+        Fix(frame, n, {1});
+    Fix(frame, 0, {0, 2});
+    Fix(frame, 2, {0, 2});
+    Join(frame, kTruss, 0, 1);
+    Join(frame, kTruss, 1, 2);
+    T_STAGED_MODEL model = OneStage(frame, 1);
+    model.options.geometricStiffness = true;
+    T_LOAD_CASE load;
+    CStagedSolver staged;
+    for (const double tension : {50.0, 1e-4}) { // also one of no weight beside the stiffness
+        load.pretension = {{0, tension}, {1, tension}};
+        load.nodal = {{1, {0, 0, -tension / 25, 0, 0, 0}}};
+        Build(staged, model, {load});
+        const T_RESULT r = Case(staged, 0, 0);
+        EXPECT_NEAR(-0.1, r.displacement[1][2], 1e-12) << tension;
+        EXPECT_NEAR(tension / 50, r.reaction[0][2], 1e-12 * tension);
+        EXPECT_NEAR(-tension, r.reaction[0][0], 1e-9 * tension);
+    }
+    load.pretension.clear();
+    T_SOLVER_ERROR error;
+    EXPECT_FALSE(staged.Run(std::vector<T_LOAD_CASE>{load}, error));
+    EXPECT_EQ(SOLVER_FAULT::Mechanism, error.fault);
+    EXPECT_EQ(1, error.node);
+}
+
+TEST(StagedSecondOrder, ALeaningStrutPushesAlongItsDisplacedChord)
+{
+    // A spring k holds the top against H; then a strut comes below it, and a load P: P leans by the
+    // whole displacement, so that k u = H + P u / L.
+    const double k = 200.0, h = 10.0, p = 300.0, length = 5.0;
+    T_FRAME frame = Empty();
+    AddNode(frame, {0, 0, 0});
+    AddNode(frame, {0, 0, length});
+    Fix(frame, 0, {0, 1, 2});
+    Fix(frame, 1, {1, 2});
+    Join(frame, ELEMENT_KIND::Spring, 1, 0, {k, 0, 0, 0, 0, 0});
+    Join(frame, kTruss, 0, 1);
+    T_STAGED_MODEL model = OneStage(frame, 2);
+    model.options.geometricStiffness = true;
+    model.stages[0].activateElements = {0};
+    model.stages[0].activateLoads = {{0, 1}};
+    T_STAGE strut;
+    strut.activateElements = {1};
+    strut.deactivateSupports = {{1, {false, false, true, false, false, false}}};
+    strut.activateLoads = {{1, 1}};
+    model.stages.push_back(strut);
+    CStagedSolver staged;
+    std::vector<T_LOAD_CASE> cases = Push(1, p, h);
+    std::swap(cases[0], cases[1]); // H first
+    Build(staged, model, cases);
+    T_RESULT r;
+    ASSERT_TRUE(staged.ReadSum(0, kLastStep, STAGE_SUM::All, r));
+    EXPECT_NEAR(h / k, r.displacement[1][0], 1e-13);
+    ASSERT_TRUE(staged.ReadSum(1, kLastStep, STAGE_SUM::All, r));
+    EXPECT_NEAR(h / (k - p / length), r.displacement[1][0], 1e-12);
+    EXPECT_NEAR(-p, r.force[1][0][0], 1e-9);
+}
+
+// ---- sag ----------------------------------------------------------------------------------------
+
+TEST(StagedSecondOrder, ErnstsModulusFollowsTheParabola)
+{
+    // Derivative of the chord of a shallow parabola: N L / EA - (w a)^2 L / (24 N^2), inclined.
+    T_FRAME frame = Empty();
+    frame.materials[0].density = 7.85;
+    AddNode(frame, {0, 0, 0});
+    AddNode(frame, {60, 30, 40});
+    Join(frame, kTruss, 0, 1);
+    const double w = 7.85 * kA * frame.gravity, plan = std::hypot(60.0, 30.0),
+                 length = std::sqrt(3600 + 900 + 1600.0);
+    const auto chord = [&](double n) {
+        return n * length / kEA - std::pow(w * plan / n, 2) * length / 24;
+    };
+    for (const double n : {50.0, 100.0, 1000.0}) {
+        const double step = 1e-4 * n, slope = (chord(n + step) - chord(n - step)) / (2 * step);
+        EXPECT_NEAR(length / kEA / slope, SagFactor(frame, frame.elements[0], n), 1e-7);
+    }
+    EXPECT_EQ(1e-3, SagFactor(frame, frame.elements[0], -5.0));
+    EXPECT_EQ(1e-3, SagFactor(frame, frame.elements[0], 1e-3));
+    frame.nodes[1].xyz = {0, 0, 40};
+    EXPECT_EQ(1.0, SagFactor(frame, frame.elements[0], -5.0));
+}
+
+constexpr double kBelow = 500.0; // spring below the node
+
+/// Two cables from (-+40, 0, 30) to a node at the origin, which stands on a spring.
+T_STAGED_MODEL Hanger(bool geometric)
+{
+    T_FRAME frame = Empty();
+    frame.materials[0].density = 7.85;
+    AddNode(frame, {0, 0, 0});
+    Fix(frame, 0, {0, 1});
+    for (const double x : {-40.0, 40.0}) {
+        const std::size_t anchor = AddNode(frame, {x, 0, 30});
+        Fix(frame, anchor, {0, 1, 2});
+        Join(frame, kTruss, 0, anchor);
+    }
+    Join(frame, ELEMENT_KIND::Spring, 0, 0, {0, 0, kBelow, 0, 0, 0});
+    T_STAGED_MODEL model = OneStage(frame, 2);
+    model.options = {BIRTH::OnDeformed, geometric, true};
+    model.stages[0].steps = 2;
+    model.stages[0].activateLoads = {{0, 1}, {1, 2}};
+    return model;
+}
+
+TEST(StagedSecondOrder, CablesWithSagBalanceTheirLoad)
+{
+    const double tension = 80.0, load = 90.0, length = 50.0, rise = 0.6;
+    const double across = 7.85 * kA * 9.80665 * 40.0;
+    for (const bool geometric : {false, true}) {
+        std::vector<T_LOAD_CASE> cases(2);
+        cases[0].pretension = {{0, tension}, {1, tension}};
+        cases[1].nodal.push_back({0, {0, 0, -load, 0, 0, 0}});
+        CStagedSolver staged;
+        Build(staged, Hanger(geometric), cases);
+        for (int step = 1; step <= 2; ++step) {
+            // v down stretches by rise v: N = T + k(N) rise v. The cables and the spring carry P:
+            // 2 N rise + 2 N / L v (1 - rise2) + spring v = P.
+            const auto force = [&](double v) {
+                return Root(
+                    [&](double n) {
+                        const double stiffness =
+                            kEA / length / (1 + across * across * kEA / (12 * n * n * n));
+                        return n - tension - stiffness * rise * v;
+                    },
+                    20.0, 400.0);
+            };
+            const double p = step == 2 ? load : 0.0;
+            const double v = Root(
+                [&](double at) {
+                    const double n = force(at), leaning = geometric ? n / length * at * 0.64 : 0.0;
+                    return 2 * n * rise + 2 * leaning + kBelow * at - p;
+                },
+                -0.2, 0.2);
+            T_RESULT r;
+            ASSERT_TRUE(staged.ReadSum(0, step, STAGE_SUM::All, r));
+            EXPECT_NEAR(-v, r.displacement[0][2], 1e-10) << step << geometric;
+            EXPECT_NEAR(force(v), r.force[0][0][0], 1e-7);
+            EXPECT_NEAR(p, 2 * r.reaction[1][2] + r.reaction[0][2], 1e-7);
+            const T_RESULT sum = Sum(Case(staged, 0, 0, step), Case(staged, 0, 1, step));
+            ExpectSame(sum, r, 1e-10);
+        }
+        EXPECT_GT(staged.Cost().iterations, 2u);
+        EXPECT_LT(staged.Cost().iterations, 50u);
+    }
+}
+
+// ---- a small cable-stayed bridge ----------------------------------------------------------------
+
+constexpr std::size_t kTop = 5;
+
+/// Deck nodes 0 to 3 along X from the tower's foot 4 outwards on one side, backstay to 6; stays
+/// (elements 5, 6, 7) and backstay 8 come with the deck's pieces.
+T_STAGED_MODEL Stayed()
+{
+    T_STAGED_MODEL model;
+    T_FRAME& frame = model.frame;
+    frame = Empty();
+    frame.materials[0].density = 7.85;
+    for (const T_VEC3 at : {T_VEC3{0, 0, 10},
+                            {12, 0, 10},
+                            {24, 0, 10},
+                            {36, 0, 10},
+                            {0, 0, 0},
+                            {0, 0, 30},
+                            {-25, 0, 4}})
+        AddNode(frame, at);
+    for (T_NODE& node : frame.nodes)
+        node.fixed = {false, true, false, true, false, true};
+    FixAll(frame, 4);
+    Fix(frame, 6, {0, 2});
+    Join(frame, kBeam, 4, 0);
+    Join(frame, kBeam, 0, kTop);
+    for (const std::size_t n : {0, 1, 2})
+        Join(frame, kBeam, n, n + 1);
+    for (const std::size_t n : {1, 2, 3})
+        Join(frame, kTruss, n, kTop);
+    Join(frame, kTruss, 6, kTop);
+    model.options = {BIRTH::OnDeformed, true, true};
+    model.groups.assign(3, LOAD_GROUP::Dead);
+    model.stages.resize(3);
+    model.stages[0].activateElements = {0, 1, 2, 5, 8};
+    model.stages[1].activateElements = {3, 6};
+    model.stages[2].activateElements = {4, 7};
+    for (std::size_t n = 0; n < frame.nodes.size(); ++n)
+        model.stages[0].activateSupports.push_back({n, {}});
+    for (std::size_t s = 0; s < 3; ++s)
+        model.stages[s].activateLoads = {{s, 1}};
+    return model;
+}
+
+/// Each with the weight of the new piece, its stay's tension and some of the backstay's.
+std::vector<T_LOAD_CASE> StayedCases()
+{
+    std::vector<T_LOAD_CASE> cases(3);
+    for (std::size_t s = 0; s < 3; ++s) {
+        cases[s].nodal.push_back({s + 1, {0, 0, -30.0, 0, 2.0, 0}});
+        cases[s].pretension = {{5 + s, 90.0 - 10.0 * double(s)}, {8, 50.0}};
+    }
+    return cases;
+}
+
+T_VEC3 Minus(const T_VEC3& a, const T_VEC3& b)
+{
+    return {a[0] - b[0], a[1] - b[1], a[2] - b[2]};
+}
+
+TEST(StagedSecondOrder, EveryStageOfAStayedBridgeIsInBalance)
+{
+    const T_STAGED_MODEL model = Stayed();
+    const std::vector<T_LOAD_CASE> cases = StayedCases();
+    CStagedSolver staged;
+    Build(staged, model, cases);
+    const T_FRAME& frame = model.frame;
+    T_RESULT r, before;
+    before.displacement.resize(frame.nodes.size());
+    std::vector<double> tension(frame.elements.size(), 0.0);
+    std::vector<T_RESULT> births(frame.elements.size());
+    for (std::size_t s = 0; s < 3; ++s) {
+        ASSERT_TRUE(staged.ReadSum(s, kLastStep, STAGE_SUM::All, r));
+        std::vector<T_VEC6> rest = r.reaction;
+        for (const T_PRETENSION& p : cases[s].pretension)
+            tension[p.element] += p.force;
+        for (std::size_t c = 0; c <= s; ++c) {
+            for (std::size_t d = 0; d < 6; ++d)
+                rest[cases[c].nodal[0].node][d] += cases[c].nodal[0].load[d];
+            for (const std::size_t e : model.stages[c].activateElements) {
+                if (c == s) births[e] = before;
+                const T_ELEMENT& el = frame.elements[e];
+                const T_VEC3 along = Minus(frame.nodes[el.j].xyz, frame.nodes[el.i].xyz);
+                const double length = std::hypot(along[0], along[2]), x = along[0] / length,
+                             z = along[2] / length;
+                for (const bool atJ : {false, true}) {
+                    // On the node: from the beam's cut; axial, shear z and moment y in the plane.
+                    const std::size_t node = atJ ? el.j : el.i;
+                    const T_VEC6& f = r.force[e][atJ ? 4 : 0];
+                    double across = f[2], moment = f[4];
+                    const double sign = atJ ? -1.0 : 1.0;
+                    double acrossX = -z, acrossZ = x; // local z; of the tower it is global X
+                    if (el.kind == kBeam && x == 0.0) {
+                        acrossX = 1.0;
+                        acrossZ = 0.0;
+                        moment = -moment; // local y is -Y
+                    }
+                    if (el.kind == kTruss) {
+                        const double drift =
+                            -z * (r.displacement[el.j][0] - r.displacement[el.i][0]) +
+                            x * (r.displacement[el.j][2] - r.displacement[el.i][2]);
+                        across = f[0] / length * drift;
+                    }
+                    rest[node][0] += sign * (f[0] * x + across * acrossX);
+                    rest[node][2] += sign * (f[0] * z + across * acrossZ);
+                    rest[node][4] += sign * moment;
+                }
+                if (el.kind != kTruss) continue;
+                const auto stretch = [&](const T_RESULT& at) {
+                    const T_VEC6 &i = at.displacement[el.i], &j = at.displacement[el.j];
+                    return x * (j[0] - i[0]) + z * (j[2] - i[2]);
+                };
+                const double n = r.force[e][0][0], w = 7.85 * kA * frame.gravity;
+                const double sag = std::pow(w * along[0], 2) * kEA / (12 * n * n * n);
+                const double modulus = std::max(1e-3, 1 / (1 + sag)); // one stay goes slack
+                EXPECT_NEAR(tension[e] + modulus * kEA / length * (stretch(r) - stretch(births[e])),
+                            n, 1e-8)
+                    << s << " element " << e;
+                EXPECT_LT(modulus, 0.999);
+            }
+        }
+        EXPECT_LT(LargestOf(rest), 1e-8) << s;
+        EXPECT_GT(std::fabs(r.displacement[s + 1][2]), 1e-3); // far above what rounding could hide
+        before = r;
+    }
+}
+
+TEST(StagedSecondOrder, WithoutAxialForcesItIsTheFirstOrder)
+{
+    T_STAGED_MODEL model = Column(3);
+    const std::vector<T_LOAD_CASE> cases = Push(3, 0.0, 5.0);
+    CStagedSolver second, first;
+    Build(second, model, cases);
+    model.options.geometricStiffness = false;
+    Build(first, model, cases);
+    ExpectSame(Case(first, 0, 1), Case(second, 0, 1), 1e-10);
+}
+
+} // namespace
