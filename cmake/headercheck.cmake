@@ -1,25 +1,27 @@
-# Compiles every public header of the rooms alone, so that none leans on another's includes.
-set(header_sources)
-set(rooms qm_base qm_solver qm_db qm_cmd qm_rps)
+# Every header stands alone: a source of its own name includes it first, or it is parsed here, all of
+# them in one step of the build.
+find_package(Python3 REQUIRED COMPONENTS Interpreter)
+find_package(Eigen3 3.4 REQUIRED NO_MODULE)
 if(QM_UI)
-  list(APPEND rooms qm_ui)
+  find_package(Qt6 REQUIRED COMPONENTS Core Gui Widgets PrintSupport)
 endif()
-# Headers that only the sources of their own room include are not public.
-set(internal "qm_db/(json|case[a-z]+[.]h|sqlite|recordcodec|recordbody|modelschema|modelreader|resultblock|recorderfile|checksum|filehandle|modellock|modeltemp|storefault|hingefields|hingenames|structfields|structnames|loadfields|staticblocks)")
-foreach(room ${rooms})
-  file(GLOB headers RELATIVE ${PROJECT_SOURCE_DIR}/src ${PROJECT_SOURCE_DIR}/src/${room}/*.h)
-  foreach(header ${headers})
-    if(header MATCHES "${internal}" AND NOT header MATCHES "qm_db/casefile[.]h")
-      continue()
-    endif()
-    string(REPLACE "/" "_" name ${header})
-    set(source ${CMAKE_CURRENT_BINARY_DIR}/headers/${name}.cpp)
-    file(CONFIGURE OUTPUT ${source} CONTENT "#include \"${header}\"\n")
-    list(APPEND header_sources ${source})
-  endforeach()
+file(GLOB_RECURSE headers CONFIGURE_DEPENDS ${PROJECT_SOURCE_DIR}/src/*.h)
+set(stamp ${CMAKE_CURRENT_BINARY_DIR}/headers.stamp)
+set(header_flags -std=c++20 -I${PROJECT_SOURCE_DIR}/src)
+set(header_libraries Eigen3::Eigen)
+if(QM_UI)
+  list(APPEND header_flags -DQM_UI)
+  list(APPEND header_libraries Qt6::Core Qt6::Gui Qt6::Widgets Qt6::PrintSupport)
+endif()
+foreach(library ${header_libraries})
+  list(APPEND header_includes $<TARGET_PROPERTY:${library},INTERFACE_INCLUDE_DIRECTORIES>)
 endforeach()
-add_library(qm_header_check OBJECT ${header_sources})
-target_link_libraries(qm_header_check PRIVATE qm::rps qm_flags)
-if(QM_UI)
-  target_link_libraries(qm_header_check PRIVATE qm::ui)
-endif()
+add_custom_command(
+  OUTPUT ${stamp}
+  COMMAND Python3::Interpreter ${PROJECT_SOURCE_DIR}/cmake/checkheaders.py ${PROJECT_SOURCE_DIR}
+          ${stamp} ${CMAKE_CXX_COMPILER} ${header_flags}
+          "-isystem$<JOIN:${header_includes},;-isystem>"
+  DEPENDS ${headers} ${PROJECT_SOURCE_DIR}/cmake/checkheaders.py
+  COMMENT "Parsing headers alone"
+  COMMAND_EXPAND_LISTS VERBATIM)
+add_custom_target(qm_header_check ALL DEPENDS ${stamp})
