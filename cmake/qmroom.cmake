@@ -29,3 +29,13 @@ function(qm_room name)
   target_link_libraries(${name} PUBLIC ${ROOM_DEPENDS}
                         PRIVATE $<BUILD_INTERFACE:qm_flags> ${ROOM_PRIVATE_DEPENDS})
 endfunction()
+
+# Heavy headers that target_precompile_headers() parses once for a target. The core rooms have none:
+# there a source that includes its own header first proves that the header stands alone.
+set(QM_PCH_TEST <gtest/gtest.h> <algorithm> <filesystem> <fstream> <functional> <map> <memory> <optional>
+                <span> <string> <vector>)
+set(QM_PCH_JSON <nlohmann/json.hpp> <algorithm> <functional> <map> <memory> <optional> <string> <vector>)
+set(QM_PCH_QT <QAbstractTableModel> <QApplication> <QBoxLayout> <QComboBox> <QDialog> <QFormLayout>
+              <QGridLayout> <QLabel> <QLineEdit> <QMainWindow> <QPainter> <QPushButton> <QString>
+              <QTableView> <QTimer> <QWidget> <algorithm> <functional> <map> <memory> <optional>
+              <string> <vector>)
