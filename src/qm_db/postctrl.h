@@ -4,6 +4,7 @@
 #include "qm_db/results/stagedreader.h"
 #include "qm_db/results/staticreader.h"
 
+#include <cstdint>
 #include <map>
 #include <string>
 #include <vector>
@@ -95,6 +96,9 @@ public:
     [[nodiscard]] int GetStrbNew(int element, int position, T_DOF6& out);
     /// 1 the static load case has results of the model as it is; 0 Error says why not.
     [[nodiscard]] int CheckStaticResult(int loadCase);
+    /// Another number when what static results show has changed: structure, loads, results or
+    /// units; not when only combinations or load factor items did.
+    std::uint64_t StaticRevision();
 
     /// Makes the state at the end of a step of a construction stage the current stage result.
     /// stage: its key; step: its number, or kStageLastStep; load: a key of CAttrCtrl::GetSgldKey.
@@ -158,6 +162,8 @@ private:
     int m_pushover = 0;
     int m_step = 0;
     long m_revision = -1; // revision of the data that the caches belong to
+    long m_staticRevisionAt = -1;
+    std::uint64_t m_staticRevision = 0; // at that revision of the data
     std::vector<double> m_factors, m_reactions;
     std::map<int, std::vector<double>> m_series;
     std::string m_error;

@@ -1,9 +1,21 @@
 #include "qm_base/msgfunction.h"
 #include "qm_db/postctrl.h"
+#include "qm_db/results/fingerprint.h"
 
 // Results of static load cases, of their combinations and of construction stages.
 
 using zql::lib::MMSGFunction;
+
+namespace {
+
+/// Order-dependent mix of 64-bit numbers (FNV-1a over whole words).
+std::uint64_t Mixed(std::uint64_t hash, std::uint64_t value)
+{
+    constexpr std::uint64_t prime = 1099511628211ULL;
+    return (hash ^ value) * prime;
+}
+
+} // namespace
 
 T_LCOM_D CPostCtrl::MakeLoadComb(int loadCase, double factor)
 {
@@ -134,4 +146,23 @@ int CPostCtrl::CheckStagedResult()
     const int done = m_staged.Check();
     m_error = m_staged.Error();
     return done;
+}
+
+std::uint64_t CPostCtrl::StaticRevision()
+{
+    if (m_data.Revision() == m_staticRevisionAt) return m_staticRevision;
+    const T_MODEL& model = m_data.Model();
+    const std::uint64_t structure = FingerprintOfStructure(model);
+    std::uint64_t hash = Mixed(structure, static_cast<std::uint64_t>(m_data.Units().force));
+    hash = Mixed(hash, static_cast<std::uint64_t>(m_data.Units().length));
+    for (const auto& [key, loadCase] : model.loadCases) {
+        hash = Mixed(hash, static_cast<std::uint64_t>(key));
+        hash = Mixed(hash, FingerprintOfCase(structure, loadCase));
+    }
+    for (const auto& [key, result] : m_data.Content().staticResults) {
+        hash = Mixed(hash, static_cast<std::uint64_t>(key));
+        hash = Mixed(hash, result->Fingerprint());
+    }
+    m_staticRevisionAt = m_data.Revision();
+    return m_staticRevision = hash;
 }

@@ -2,12 +2,13 @@
 
 #include "qm_base/textformat.h"
 #include "qm_rps/factors/ulfchecks.h"
+#include "qm_rps/optdsgn.h"
 
 #include <algorithm>
 
 CUnknownLoadFactorItemDlg::CUnknownLoadFactorItemDlg(CDBDoc& doc, int key)
     : CUlfItemDialog(doc), m_key(key), m_source(doc),
-      m_cache(m_source, [this] { return m_source.Revision(); })
+      m_cache(m_source, [this] { return m_doc.Post().StaticRevision(); })
 {
     T_ULFI_D item;
     if (!m_doc.Attr().GetUlfi(key, item)) {

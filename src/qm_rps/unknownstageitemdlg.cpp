@@ -3,6 +3,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/factors/ulfstageplace.h"
+#include "qm_rps/optdsgn.h"
 #include "qm_rps/ulfiterationrundlg.h"
 
 #include <algorithm>

@@ -212,16 +212,15 @@ TEST_F(UnknownLoadFactor, SolvesAgainAfterOtherBoundsAndAfterOtherResults)
     CUnknownLoadFactorConstraintDlg lift(m_doc, 1);
     lift.m_constraint.value = 0.1;
     ASSERT_EQ(1, lift.OnOK());
-    CUlfStaticResponse source(m_doc);
-    const std::uint64_t before = source.Revision();
+    const std::uint64_t before = m_doc.Post().StaticRevision();
     ASSERT_EQ(1, dlg.OnCalculate());
     EXPECT_NEAR(0.1, UlfValue(*dlg.Result(), 0), 1e-12);
-    EXPECT_EQ(before, source.Revision()); // the cache lives on
+    EXPECT_EQ(before, m_doc.Post().StaticRevision()); // the cache lives on
 
     T_MODEL_CONTENT content = m_doc.Data().Content();
     content.model.styp.units.length = LENGTH_UNIT::mm;
     m_doc.Data().Assign(content);
-    EXPECT_NE(before, source.Revision());
+    EXPECT_NE(before, m_doc.Post().StaticRevision());
     ASSERT_EQ(1, dlg.OnCalculate());
     EXPECT_NEAR(100.0, UlfValue(*dlg.Result(), 0), 1e-9); // in mm
 }

@@ -1,7 +1,7 @@
 // Debug dump of a problem handed to the load factor solver.
 #pragma once
 
-#include "qm_rps/optdsgn.h"
+#include "qm_rps/factors/optproblem.h"
 
 /// The text of the dump file.
 std::string OptDumpText(const T_OPT_SYSTEM& system, bool exact, int iobj, int isign);

@@ -14,7 +14,7 @@
 /// Memory: 8 bytes per quantity and load case read.
 /// State: lives with one item's model; everything is dropped when `revision` gives another number
 /// (what the responses follow from has changed: structure, loads, results or units; see
-/// CUlfStaticResponse::Revision).
+/// CPostCtrl::StaticRevision).
 class CUlfInfluenceCache : public IUlfResponse {
 public:
     /// `source` is not owned and must outlive this object.

@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_db/records.h"
-#include "qm_rps/optdsgn.h"
+#include "qm_rps/factors/optproblem.h"
 
 /// A load case of the item's combination.
 struct T_ULF_CASE {

@@ -2,23 +2,11 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_db/dbdoc.h"
-#include "qm_db/results/fingerprint.h"
 #include "qm_rps/factors/optrows.h"
 
 #include <cmath>
 
 using zql::lib::MMSGFunction;
-
-namespace {
-
-/// Order-dependent mix of 64-bit numbers (FNV-1a over whole words).
-std::uint64_t Mixed(std::uint64_t hash, std::uint64_t value)
-{
-    constexpr std::uint64_t prime = 1099511628211ULL;
-    return (hash ^ value) * prime;
-}
-
-} // namespace
 
 int CUlfStaticResponse::ReadOne(const T_OPT_QUANTITY& what, double& out)
 {
@@ -65,24 +53,4 @@ int CUlfStaticResponse::Read(std::span<const T_OPT_ITEM> items,
         return 0;
     }
     return 1;
-}
-
-std::uint64_t CUlfStaticResponse::Revision()
-{
-    const CDataCtrl& data = m_doc.Data();
-    if (data.Revision() == m_documentRevision) return m_revision;
-    const T_MODEL& model = data.Model();
-    const std::uint64_t structure = FingerprintOfStructure(model);
-    std::uint64_t hash = Mixed(structure, static_cast<std::uint64_t>(data.Units().force));
-    hash = Mixed(hash, static_cast<std::uint64_t>(data.Units().length));
-    for (const auto& [key, loadCase] : model.loadCases) {
-        hash = Mixed(hash, static_cast<std::uint64_t>(key));
-        hash = Mixed(hash, FingerprintOfCase(structure, loadCase));
-    }
-    for (const auto& [key, result] : data.Content().staticResults) {
-        hash = Mixed(hash, static_cast<std::uint64_t>(key));
-        hash = Mixed(hash, result->Fingerprint());
-    }
-    m_documentRevision = data.Revision();
-    return m_revision = hash;
 }

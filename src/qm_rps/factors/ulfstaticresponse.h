@@ -3,8 +3,6 @@
 
 #include "qm_rps/factors/ulfresponse.h"
 
-#include <cstdint>
-
 class CDBDoc;
 
 /// Each item's load case is made a combination of its own with factor 1, selected once, and
@@ -18,15 +16,9 @@ public:
     /// Names the load case and says what is missing: no results, results older than the model.
     std::string Error() const override { return m_error; }
 
-    /// Another number when structure, loads, results or units changed; not when only items,
-    /// constraints or combinations did.
-    std::uint64_t Revision();
-
 private:
     [[nodiscard]] int ReadOne(const T_OPT_QUANTITY& what, double& out);
 
     CDBDoc& m_doc;
     std::string m_error;
-    long m_documentRevision = -1;
-    std::uint64_t m_revision = 0; // at that revision of the document
 };
