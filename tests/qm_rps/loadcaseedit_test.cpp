@@ -1,8 +1,8 @@
 // Load cases edited on a document: stored as one step, refused whole.
+#include "frametest.h"
 #include "qm_db/casefile.h"
 #include "qm_rps/po_loadcasedlg.h"
 #include "qm_rps/po_loadcaselistdlg.h"
-#include "scriptview.h"
 
 namespace {
 

@@ -1,12 +1,12 @@
 #include "qm_rps/rps_main.h"
 
+#include "frametest.h"
 #include "qm_base/appbase.h"
 #include "qm_rps/po_loadcasedlg.h"
 #include "qm_rps/po_loadcaselistdlg.h"
 #include "qm_rps/po_selectloadcasedlg.h"
 #include "qm_rps/pushovermanager.h"
 #include "qm_rps/rpsmanager.h"
-#include "scriptview.h"
 
 #include <cerrno>
 

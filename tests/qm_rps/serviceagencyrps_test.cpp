@@ -1,5 +1,7 @@
 #include "qm_rps/serviceagencyrps.h"
 
+#include "frametest.h"
+#include "numbers.h"
 #include "qm_base/appbase.h"
 #include "qm_rps/po_femastrlossfigure0dlg.h"
 #include "qm_rps/po_femastrlossfigureedlg.h"
@@ -7,9 +9,7 @@
 #include "qm_rps/po_hingeskcvtabfemaaxialdlg.h"
 #include "qm_rps/po_hingeskcvtabfemadlg.h"
 #include "qm_rps/rps_main.h"
-#include "scriptview.h"
 
-#include <limits>
 #include <random>
 
 namespace {
@@ -239,7 +239,7 @@ TEST_F(Service, TheAxialTableHoldsTenForcesAndRefusesBadOnes)
     d.SetView(&m_view);
     EXPECT_EQ(0, d.Data2Dlg(Rows({1, 2, 3, 4, 5, 6, 7, 8, 9, 10, 11})));
     EXPECT_EQ(0, d.Data2Dlg(Rows({1, 1})));
-    EXPECT_EQ(0, d.Data2Dlg(Rows({std::numeric_limits<double>::quiet_NaN()})));
+    EXPECT_EQ(0, d.Data2Dlg(Rows({kNan})));
     ASSERT_EQ(1, d.Data2Dlg(Rows({1, 2, 3, 4, 5, 6, 7, 8, 9, 10})));
     EXPECT_EQ(0, d.AddForce(11.0));
     for (double f = 1.0; f < 10.5; f += 1.0)

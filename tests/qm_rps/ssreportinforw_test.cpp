@@ -1,9 +1,9 @@
 #include "qm_rps/ssreportinforw.h"
 
+#include "frametest.h"
 #include "qm_base/appbase.h"
 #include "qm_rps/irpsinterfaceimpl.h"
 #include "qm_rps/rpsmanager.h"
-#include "scriptview.h"
 
 namespace {
 class Report : public FrameTest {};

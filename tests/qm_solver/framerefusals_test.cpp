@@ -1,15 +1,12 @@
 // What the engine refuses, with the place that is at fault.
+#include "numbers.h"
 #include "solved.h"
 
 #include <functional>
-#include <limits>
 
 namespace {
 
 using namespace sample;
-
-constexpr double kNan = std::numeric_limits<double>::quiet_NaN();
-constexpr double kInf = std::numeric_limits<double>::infinity();
 
 struct T_REFUSED_MODEL {
     const char* label;

@@ -3,13 +3,8 @@
 #include <algorithm>
 #include <bit>
 #include <cstdint>
-#include <filesystem>
-#include <fstream>
-#include <iterator>
 #include <limits>
-#include <stdlib.h>
 
-namespace fs = std::filesystem;
 using Limits = std::numeric_limits<double>;
 
 namespace {
@@ -153,38 +148,4 @@ bool SameContent(const T_MODEL_CONTENT& a, const T_MODEL_CONTENT& b)
         if (other == b.results.end() || !SameResult(*source, *other->second)) return false;
     }
     return true;
-}
-
-std::string BytesOf(const std::string& path)
-{
-    std::ifstream file(path, std::ios::binary);
-    return {std::istreambuf_iterator<char>(file), {}};
-}
-
-void WriteBytes(const std::string& path, const std::string& bytes)
-{
-    std::ofstream(path, std::ios::binary)
-        .write(bytes.data(), static_cast<std::streamsize>(bytes.size()));
-}
-
-CTempFolder::CTempFolder()
-{
-    m_path = (fs::temp_directory_path() / "modelstore-XXXXXX").string();
-    if (!::mkdtemp(m_path.data())) m_path.clear();
-}
-
-CTempFolder::~CTempFolder()
-{
-    std::error_code ignored;
-    fs::permissions(m_path, fs::perms::owner_all, ignored);
-    fs::remove_all(m_path, ignored);
-}
-
-std::vector<std::string> CTempFolder::Names() const
-{
-    std::vector<std::string> names;
-    for (const auto& entry : fs::directory_iterator(m_path))
-        names.push_back(entry.path().filename().string());
-    std::sort(names.begin(), names.end());
-    return names;
 }

@@ -1,6 +1,8 @@
 // Contents and files for the tests of the model file.
 #pragma once
 
+#include "tempfolder.h"
+
 #include "qm_db/modelstore.h"
 
 #include <string>
@@ -18,22 +20,12 @@ double SampleDisplacement(int node, int step);
 /// read is unequal to everything.
 bool SameContent(const T_MODEL_CONTENT& a, const T_MODEL_CONTENT& b);
 
-std::string BytesOf(const std::string& path);
-void WriteBytes(const std::string& path, const std::string& bytes);
+inline std::string BytesOf(const std::string& path)
+{
+    return ReadText(path);
+}
 
-/// An empty folder, removed at the end.
-class CTempFolder {
-public:
-    CTempFolder();
-    CTempFolder(const CTempFolder&) = delete;
-    CTempFolder& operator=(const CTempFolder&) = delete;
-    ~CTempFolder();
-
-    const std::string& Path() const { return m_path; }
-    std::string File(const std::string& name) const { return m_path + '/' + name; }
-    /// Names of what is in it, sorted.
-    std::vector<std::string> Names() const;
-
-private:
-    std::string m_path;
-};
+inline void WriteBytes(const std::string& path, const std::string& bytes)
+{
+    WriteText(path, bytes);
+}

@@ -3,9 +3,7 @@
 #include "qm_base/textformat.h"
 
 #include <cstdlib>
-#include <fstream>
 #include <sstream>
-#include <unistd.h>
 
 namespace fs = std::filesystem;
 
@@ -13,7 +11,8 @@ namespace {
 
 constexpr const char* kProfile = R"(<?xml version="1.0" encoding="UTF-8"?>
 <oor:items xmlns:oor="http://openoffice.org/2001/registry">
-<item oor:path="/org.openoffice.Office.Calc/Formula/Load"><prop oor:name="OOXMLRecalcMode" oor:op="fuse"><value>0</value></prop></item>
+<item oor:path="/org.openoffice.Office.Calc/Formula/Load">
+<prop oor:name="OOXMLRecalcMode" oor:op="fuse"><value>0</value></prop></item>
 </oor:items>
 )";
 
@@ -73,17 +72,8 @@ bool COffice::IsThere()
 
 COffice::COffice()
 {
-    std::string name = (fs::temp_directory_path() / "qm-office-XXXXXX").string();
-    if (!::mkdtemp(name.data())) return;
-    m_folder = name;
-    fs::create_directories(m_folder / "profile/user");
-    std::ofstream(m_folder / "profile/user/registrymodifications.xcu") << kProfile;
-}
-
-COffice::~COffice()
-{
-    std::error_code ignored;
-    if (!m_folder.empty()) fs::remove_all(m_folder, ignored);
+    fs::create_directories(m_folder.Path() / "profile/user");
+    WriteText(m_folder / "profile/user/registrymodifications.xcu", kProfile);
 }
 
 OFFICE_CELLS COffice::Convert(const std::string& sheet, bool formulas) const
@@ -93,10 +83,10 @@ OFFICE_CELLS COffice::Convert(const std::string& sheet, bool formulas) const
         std::string("csv:Text - txt - csv (StarCalc):59,34,76,1,,0,false,false,false,") +
         (formulas ? "true" : "false");
     if (!Succeeds("LC_ALL=C.UTF-8 timeout 120 soffice -env:UserInstallation=file://" +
-                  Quoted((m_folder / "profile").string()) + " --headless --convert-to " +
-                  Quoted(filter) + " --outdir " + Quoted(m_folder.string()) + " " + Quoted(sheet)))
+                  Quoted(m_folder / "profile") + " --headless --convert-to " + Quoted(filter) +
+                  " --outdir " + Quoted(m_folder.Path().string()) + " " + Quoted(sheet)))
         return {};
-    std::ifstream csv(m_folder / fs::path(sheet).filename().replace_extension(".csv"));
+    std::ifstream csv(m_folder.Path() / fs::path(sheet).filename().replace_extension(".csv"));
     OFFICE_CELLS rows;
     for (std::string line; std::getline(csv, line);)
         rows.push_back(SplitRow(line));

@@ -1,7 +1,8 @@
 // An office program without a screen that recalculates the spreadsheets of the tests.
 #pragma once
 
-#include <filesystem>
+#include "tempfolder.h"
+
 #include <string>
 #include <vector>
 
@@ -15,9 +16,6 @@ public:
     static bool IsThere();
 
     COffice();
-    COffice(const COffice&) = delete;
-    COffice& operator=(const COffice&) = delete;
-    ~COffice();
 
     /// All cells of the sheet in full precision (15 digits), or the formulas in place of their
     /// values; no rows when the program fails.
@@ -30,5 +28,5 @@ public:
 
 private:
     OFFICE_CELLS Convert(const std::string& sheet, bool formulas) const;
-    std::filesystem::path m_folder;
+    CTempFolder m_folder;
 };

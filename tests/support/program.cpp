@@ -3,7 +3,6 @@
 #include <algorithm>
 #include <array>
 #include <fcntl.h>
-#include <fstream>
 #include <gtest/gtest.h>
 #include <sstream>
 #include <sys/prctl.h>
@@ -112,47 +111,6 @@ T_RUN RunShell(const std::string& line, const fs::path& folder)
     T_RUN_OPTIONS options;
     options.folder = folder;
     return Run("/bin/sh", {"-c", "PATH='" + bin + "':$PATH; " + line}, options);
-}
-
-CTempFolder::CTempFolder()
-{
-    std::string name = (fs::temp_directory_path() / "qm-rps-test-XXXXXX").string();
-    if (!mkdtemp(name.data())) throw std::runtime_error("no temporary folder");
-    m_path = name;
-}
-
-CTempFolder::~CTempFolder()
-{
-    std::error_code ignored;
-    for (fs::recursive_directory_iterator it(m_path, ignored), end; it != end;
-         it.increment(ignored)) {
-        if (it->is_directory()) fs::permissions(it->path(), fs::perms::owner_all, ignored);
-    }
-    fs::remove_all(m_path, ignored);
-}
-
-std::vector<std::string> CTempFolder::Names() const
-{
-    std::vector<std::string> names;
-    for (const auto& entry : fs::directory_iterator(m_path))
-        names.push_back(entry.path().filename().string());
-    std::sort(names.begin(), names.end());
-    return names;
-}
-
-std::string ReadText(const fs::path& path)
-{
-    std::ifstream file(path, std::ios::binary);
-    std::ostringstream text;
-    text << file.rdbuf();
-    return text.str();
-}
-
-void WriteText(const fs::path& path, const std::string& text)
-{
-    std::ofstream file(path, std::ios::binary);
-    file << text;
-    ASSERT_TRUE(file.flush().good()) << path;
 }
 
 std::vector<std::string> Lines(const std::string& text)

@@ -1,6 +1,8 @@
 // Runs the real program on real files, for the tests of the whole.
 #pragma once
 
+#include "tempfolder.h"
+
 #include <filesystem>
 #include <string>
 #include <vector>
@@ -23,24 +25,6 @@ T_RUN RunProgram(const std::vector<std::string>& arguments, const T_RUN_OPTIONS&
 /// Runs one line of shell in which `qm-rps` is the program.
 T_RUN RunShell(const std::string& line, const std::filesystem::path& folder);
 
-/// A new folder that is removed with everything in it.
-class CTempFolder {
-public:
-    CTempFolder();
-    CTempFolder(const CTempFolder&) = delete;
-    CTempFolder& operator=(const CTempFolder&) = delete;
-    ~CTempFolder();
-    const std::filesystem::path& Path() const { return m_path; }
-    std::string operator/(const std::string& name) const { return (m_path / name).string(); }
-    /// Names in it, in order.
-    std::vector<std::string> Names() const;
-
-private:
-    std::filesystem::path m_path;
-};
-
-std::string ReadText(const std::filesystem::path& path);
-void WriteText(const std::filesystem::path& path, const std::string& text);
 std::vector<std::string> Lines(const std::string& text);
 
 /// The project's folder and its examples.

@@ -1,10 +1,10 @@
 #include "qm_solver/sparse/sparsefactor.h"
 
 #include "densematrix.h"
+#include "numbers.h"
 
 #include <gtest/gtest.h>
 
-#include <limits>
 #include <numeric>
 #include <thread>
 
@@ -170,7 +170,7 @@ TEST(SparseFactor, RefusesWhatIsOutOfPlaceWithAReason)
     ASSERT_EQ(1, factor.Factor(m, reason));
     EXPECT_EQ(0, factor.Solve(rhs, 2, reason));
     EXPECT_EQ(1, factor.Solve(rhs, 1, reason));
-    m.value[3] = std::numeric_limits<double>::quiet_NaN();
+    m.value[3] = kNan;
     EXPECT_EQ(0, factor.Factor(m, reason));
     EXPECT_EQ(0, factor.Solve(rhs, 1, reason)); // the old factor is not used by mistake
     EXPECT_EQ(0, factor.Factor(Upper(RandomMatrix(18, 40.0, 9)), reason));

@@ -1,5 +1,6 @@
 #include "qm_ui/plot/plotfile.h"
 
+#include "tempfolder.h"
 #include "testapp.h"
 
 #include <QImage>
@@ -8,8 +9,6 @@
 #include <gtest/gtest.h>
 
 #include <filesystem>
-#include <fstream>
-#include <iterator>
 #include <string>
 
 namespace {
@@ -27,29 +26,12 @@ T_PLOT Plot()
     return plot;
 }
 
-std::string Content(const fs::path& path)
-{
-    std::ifstream in(path, std::ios::binary);
-    return {std::istreambuf_iterator<char>(in), {}};
-}
-
 class PlotFile : public testing::Test {
 protected:
-    void SetUp() override
-    {
-        const auto* info = testing::UnitTest::GetInstance()->current_test_info();
-        m_dir = fs::path(testing::TempDir()) / (std::string("qm_plotfile_") + info->name());
-        fs::remove_all(m_dir);
-        fs::create_directories(m_dir);
-    }
-    void TearDown() override { fs::remove_all(m_dir); }
-    [[nodiscard]] std::string Path(const char* name) const { return (m_dir / name).string(); }
-    [[nodiscard]] long Count() const
-    {
-        return std::distance(fs::directory_iterator(m_dir), fs::directory_iterator());
-    }
+    std::string Path(const char* name) const { return m_folder / name; }
+    std::size_t Count() const { return m_folder.Names().size(); }
 
-    fs::path m_dir;
+    CTempFolder m_folder;
     std::string m_error = "old";
 };
 
@@ -64,20 +46,20 @@ TEST_F(PlotFile, PngHoldsTheCurve)
         for (int x = 0; x < image.width(); ++x)
             red += image.pixel(x, y) == qRgb(255, 0, 0) ? 1 : 0;
     EXPECT_GT(red, 1000);
-    EXPECT_EQ(1, Count());
+    EXPECT_EQ(1u, Count());
 }
 
 TEST_F(PlotFile, SvgLoadsAndHoldsTheTitle)
 {
     ASSERT_EQ(1, WritePlotFile(Plot(), Path("a.svg"), m_error)) << m_error;
-    const std::string text = Content(Path("a.svg"));
+    const std::string text = ReadText(Path("a.svg"));
     EXPECT_NE(std::string::npos, text.find("<title>Capacity &amp; demand</title>"));
     EXPECT_NE(std::string::npos, text.find("yield</text>"));
     NeedApp();
     const QSvgRenderer svg(QString::fromStdString(Path("a.svg")));
     EXPECT_TRUE(svg.isValid());
     EXPECT_EQ(QRectF(0, 0, 960, 640), svg.viewBoxF());
-    EXPECT_EQ(1, Count());
+    EXPECT_EQ(1u, Count());
 }
 
 TEST_F(PlotFile, UnknownExtensionIsRefusedAndLeavesNothing)
@@ -86,18 +68,18 @@ TEST_F(PlotFile, UnknownExtensionIsRefusedAndLeavesNothing)
         EXPECT_EQ(0, WritePlotFile(Plot(), Path(name), m_error));
         EXPECT_NE(std::string::npos, m_error.find(Path(name))) << m_error;
     }
-    EXPECT_EQ(0, Count());
+    EXPECT_EQ(0u, Count());
 }
 
 TEST_F(PlotFile, AFileThatCanNotBeWrittenLeavesNothing)
 {
-    fs::create_directory(m_dir / "folder.svg");
+    fs::create_directory(Path("folder.svg"));
     for (const char* name : {"missing/a.svg", "missing/a.png", "missing/a.pdf", "folder.svg"}) {
         EXPECT_EQ(0, WritePlotFile(Plot(), Path(name), m_error));
         EXPECT_NE(std::string::npos, m_error.find(Path(name))) << m_error;
     }
-    EXPECT_EQ(1, Count());
-    EXPECT_TRUE(fs::is_empty(m_dir / "folder.svg"));
+    EXPECT_EQ(1u, Count());
+    EXPECT_TRUE(fs::is_empty(Path("folder.svg")));
 }
 
 } // namespace

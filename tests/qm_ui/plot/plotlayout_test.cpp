@@ -1,13 +1,13 @@
 #include "qm_ui/plot/plotlayout.h"
 
+#include "numbers.h"
+
 #include <gtest/gtest.h>
 
-#include <limits>
 #include <string>
 
 namespace {
 
-constexpr double kNan = std::numeric_limits<double>::quiet_NaN();
 constexpr T_PLOT_BOX kPage{0, 0, 960, 640};
 
 T_PLOT_LAYOUT Calc(const T_PLOT& plot, const T_PLOT_VIEW& view = {}, T_PLOT_BOX page = kPage)

@@ -1,14 +1,12 @@
 #include "qm_ui/plot/plotscale.h"
 
+#include "numbers.h"
+
 #include <gtest/gtest.h>
 
-#include <limits>
 #include <vector>
 
 namespace {
-
-constexpr double kNan = std::numeric_limits<double>::quiet_NaN();
-constexpr double kInf = std::numeric_limits<double>::infinity();
 
 TEST(PlotScale, MapsEndsAndMiddle)
 {
