@@ -13,9 +13,9 @@ namespace {
 std::string Where(const T_FINDING& f)
 {
     std::string text;
-    if (f.component >= 0) {
-        text += std::string(kComponentNames[static_cast<std::size_t>(f.component)]) + ", ";
-        text += std::string(EndName(f.end)) + ", ";
+    if (f.part >= 0) {
+        text += std::string(kComponentNames[static_cast<std::size_t>(f.part)]) + ", ";
+        text += std::string(EndName(EndOf(f))) + ", ";
     }
     if (!f.point.empty()) text += "point " + f.point + ", ";
     return text + f.field;

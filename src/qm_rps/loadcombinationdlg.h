@@ -2,10 +2,10 @@
 // their factors.
 #pragma once
 
+#include "qm_base/checkeddialog.h"
 #include "qm_db/dbdoc.h"
-#include "qm_rps/dialog/hingedialog.h"
 
-class CLoadCombinationDlg : public CHingeDialog {
+class CLoadCombinationDlg : public CCheckedDialog {
 public:
     enum COLUMN { Part, Factor };
     static constexpr std::array<const char*, 2> kHeads{"IDS_QM_UI_LCOM_PART",

@@ -6,7 +6,7 @@ using B = T_BACKBONE;
 constexpr auto kLit = RULE_TEXT::Literal;
 
 // clang-format off
-const T_RULE<B> kEnergy[] = {
+const T_HINGE_RULE<B> kEnergy[] = {
     {{kHingeRuleMessage, kLit, "A~B >= 0.0", nullptr, "sides.pos.energy[0]", HINGE_SIDE::Positive, "A~B"}, [](const B& b) { return NotAbove(0, b.pos.energy[0]); }},
     {{kHingeRuleMessage, kLit, "A~B >= 0.0", nullptr, "sides.neg.energy[0]", HINGE_SIDE::Negative, "A~B"}, [](const B& b) { return NotAbove(0, b.neg.energy[0]); }},
     {{kHingeRuleMessage, kLit, "A~B >= C",   nullptr, "sides.pos.energy[1]", HINGE_SIDE::Positive, "C"},   [](const B& b) { return NotAbove(b.pos.energy[1], b.pos.energy[0]); }},

@@ -2,10 +2,10 @@
 // coefficient. Strengths are stresses, in the caller's units.
 #pragma once
 
-#include "qm_rps/dialog/hingedialog.h"
+#include "qm_base/checkeddialog.h"
 #include "qm_rps/hinge/hingelabels.h"
 
-class CPO_HingeMasonryDlg : public CHingeDialog {
+class CPO_HingeMasonryDlg : public CCheckedDialog {
 public:
     T_HINGE_OWNER m_owner; // for titles and units
 

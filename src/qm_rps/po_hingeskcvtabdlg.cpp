@@ -17,7 +17,7 @@ struct T_CHECK {
     bool tri = false, slip = false;
 };
 using C = T_CHECK;
-using R = T_RULE<T_CHECK>;
+using R = T_HINGE_RULE<T_CHECK>;
 constexpr auto kKey = RULE_TEXT::Key;
 constexpr auto kLit = RULE_TEXT::Literal;
 constexpr auto kPos = HINGE_SIDE::Positive;
@@ -239,10 +239,10 @@ std::vector<T_FINDING> CPO_HingeSkcvTabDlg::Findings() const
 }
 
 void CPO_HingeSkcvTabDlg::CurveFindings(const T_SKEL_MULTI& curve, SKEL_TYPE type,
-                                        const T_PLACE& place, std::vector<T_FINDING>& out)
+                                        const T_HINGE_PLACE& place, std::vector<T_FINDING>& out)
 {
     const C check{curve, curve.sides.pos, curve.sides.neg,
                   type == SKEL_TYPE::Trilinear || type == SKEL_TYPE::SlipTrilinear,
                   type == SKEL_TYPE::SlipBilinear || type == SKEL_TYPE::SlipTrilinear};
-    WalkRules(std::span<const R>(kRules), check, place, out);
+    WalkRules(kRules, check, place, out);
 }

@@ -2,10 +2,11 @@
 // Both sides hold magnitudes; units as the caller's.
 #pragma once
 
-#include "qm_rps/dialog/hingedialog.h"
+#include "qm_base/checkeddialog.h"
+#include "qm_rps/hinge/hingefindings.h"
 #include "qm_rps/hinge/hingelabels.h"
 
-class CPO_HingeSkcvTabDlg : public CHingeDialog {
+class CPO_HingeSkcvTabDlg : public CCheckedDialog {
 public:
     T_HINGE_OWNER m_owner; // for titles and units
 
@@ -31,7 +32,7 @@ public:
     void OnChangeSlipInitGap(HINGE_END end, GAP_SIDES sides);
 
     std::vector<T_FINDING> Findings() const override;
-    static void CurveFindings(const T_SKEL_MULTI& curve, SKEL_TYPE type, const T_PLACE& place,
+    static void CurveFindings(const T_SKEL_MULTI& curve, SKEL_TYPE type, const T_HINGE_PLACE& place,
                               std::vector<T_FINDING>& out);
 
 private:

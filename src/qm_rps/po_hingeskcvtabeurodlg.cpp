@@ -9,7 +9,7 @@ namespace {
 using B = T_BACKBONE;
 
 // clang-format off
-const T_RULE<B> kStiffness[] = {
+const T_HINGE_RULE<B> kStiffness[] = {
     {{kHingeRuleMessage, RULE_TEXT::Key, "IDS_RPS_PO_PHGT_Initial_Stiffness", nullptr, "sides.pos.userStiffness", HINGE_SIDE::Positive, "", " > 0"},
      [](const B& b) { return Below(0, b.pos.userStiffness); }, [](const B& b) { return b.initStiffness == INIT_STIFFNESS::User; }},
     {{kHingeRuleMessage, RULE_TEXT::Key, "IDS_RPS_PO_PHGT_Initial_Stiffness", nullptr, "sides.neg.userStiffness", HINGE_SIDE::Negative, "", " > 0"},
@@ -87,7 +87,7 @@ std::vector<T_FINDING> CPO_HingeSkcvTabEuroDlg::Findings() const
     return out;
 }
 
-void CPO_HingeSkcvTabEuroDlg::CurveFindings(const T_SKEL_EC8& curve, const T_PLACE& place,
+void CPO_HingeSkcvTabEuroDlg::CurveFindings(const T_SKEL_EC8& curve, const T_HINGE_PLACE& place,
                                             std::vector<T_FINDING>& out)
 {
     const B b{curve.sides.pos,    curve.sides.neg, curve.symmetric,

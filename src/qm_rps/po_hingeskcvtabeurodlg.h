@@ -2,13 +2,14 @@
 // as acceptance criteria). Points follow the FEMA pattern; signs and units as there.
 #pragma once
 
-#include "qm_rps/dialog/hingedialog.h"
+#include "qm_base/checkeddialog.h"
+#include "qm_rps/hinge/hingefindings.h"
 #include "qm_rps/hinge/hingelabels.h"
 
 #include <array>
 #include <optional>
 
-class CPO_HingeSkcvTabEuroDlg : public CHingeDialog {
+class CPO_HingeSkcvTabEuroDlg : public CCheckedDialog {
 public:
     T_HINGE_OWNER m_owner; // for titles and units
 
@@ -35,7 +36,7 @@ public:
     static bool IsEurocodePair(const std::string& concreteCode, const std::string& steelCode);
 
     std::vector<T_FINDING> Findings() const override;
-    static void CurveFindings(const T_SKEL_EC8& curve, const T_PLACE& place,
+    static void CurveFindings(const T_SKEL_EC8& curve, const T_HINGE_PLACE& place,
                               std::vector<T_FINDING>& out);
 
 private:

@@ -14,7 +14,7 @@
 namespace {
 
 using B = T_BACKBONE;
-using R = T_RULE<T_BACKBONE>;
+using R = T_HINGE_RULE<T_BACKBONE>;
 constexpr auto kLit = RULE_TEXT::Literal;
 constexpr auto kKey = RULE_TEXT::Key;
 constexpr auto kPos = HINGE_SIDE::Positive;
@@ -83,10 +83,10 @@ B BackboneOf(const T_SKEL_FEMA& f, const T_SIDES<T_SKEL_SIDE>& s)
             f.compliance};
 }
 
-constexpr T_RULE_HEAD kCount{"IDS_RPS_MULTI_CURVE_COUNT", kLit, nullptr, nullptr, "curves"};
+constexpr T_HINGE_HEAD kCount{"IDS_RPS_MULTI_CURVE_COUNT", kLit, nullptr, nullptr, "curves"};
 
 /// The list of curves by axial force: at least two, no force twice.
-void ListFindings(const T_SKEL_FEMA& f, const T_PLACE& place, std::vector<T_FINDING>& out)
+void ListFindings(const T_SKEL_FEMA& f, const T_HINGE_PLACE& place, std::vector<T_FINDING>& out)
 {
     if (f.curves.size() < 2) out.push_back(FindingOf(kCount, place));
     for (std::size_t i = 0; i < f.curves.size(); ++i) {
@@ -94,7 +94,7 @@ void ListFindings(const T_SKEL_FEMA& f, const T_PLACE& place, std::vector<T_FIND
         const auto end = f.curves.begin() + static_cast<std::ptrdiff_t>(i);
         if (std::find_if(f.curves.begin(), end, same) == end) continue;
         const std::string rule = FormatText("Axial Force %g already exists!", f.curves[i].axial);
-        T_RULE_HEAD head{kHingeRuleMessage, kLit, rule.c_str(), nullptr, "axial"};
+        T_HINGE_HEAD head{kHingeRuleMessage, kLit, rule.c_str(), nullptr, "axial"};
         out.push_back(FindingOf(head, {place.component, place.end, static_cast<int>(i)}));
     }
 }
@@ -189,7 +189,7 @@ std::vector<T_FINDING> CPO_HingeSkcvTabFemaDlg::Findings() const
     return out;
 }
 
-void CPO_HingeSkcvTabFemaDlg::CurveFindings(const T_SKEL_FEMA& curve, T_PLACE place,
+void CPO_HingeSkcvTabFemaDlg::CurveFindings(const T_SKEL_FEMA& curve, T_HINGE_PLACE place,
                                             std::vector<T_FINDING>& out)
 {
     if (curve.multiCurve) ListFindings(curve, place, out);

@@ -6,14 +6,15 @@
 // all that it has. Nothing leaves the editor before CheckData passes.
 #pragma once
 
-#include "qm_rps/dialog/hingedialog.h"
+#include "qm_base/checkeddialog.h"
+#include "qm_rps/hinge/hingefindings.h"
 #include "qm_rps/hinge/hingelabels.h"
 
 #include <array>
 #include <optional>
 #include <vector>
 
-class CPO_HingeSkcvTabFemaDlg : public CHingeDialog {
+class CPO_HingeSkcvTabFemaDlg : public CCheckedDialog {
 public:
     using T_ROW = std::array<double, 9>; // -E, -D, -C, -B, A, B, C, D, E
 
@@ -32,7 +33,8 @@ public:
     /// Every rule that is not kept; CheckData shows the first one.
     std::vector<T_FINDING> Findings() const override;
     /// The rules of one curve.
-    static void CurveFindings(const T_SKEL_FEMA& curve, T_PLACE place, std::vector<T_FINDING>& out);
+    static void CurveFindings(const T_SKEL_FEMA& curve, T_HINGE_PLACE place,
+                              std::vector<T_FINDING>& out);
 
     /// Despite its name, D/Dy ratio to plastic deformation: (value - 1) * thetaY.
     /// 0 where |thetaY| < 1e-7.

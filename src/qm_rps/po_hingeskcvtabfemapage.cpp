@@ -66,7 +66,7 @@ void CPO_HingeSkcvTabFemaDlg::OnEdited()
 std::string CPO_HingeSkcvTabFemaDlg::FieldOnPages(const T_FINDING& f)
 {
     T_FINDING shown = f;
-    const int chosen = AxialIndex(static_cast<HINGE_COMPONENT>(f.component), f.end);
+    const int chosen = AxialIndex(ComponentOf(f), EndOf(f));
     const std::string list = "curves[" + std::to_string(chosen) + "].";
     if (f.field.starts_with(list)) shown.field = f.field.substr(list.size());
     return PathOnPages(shown);

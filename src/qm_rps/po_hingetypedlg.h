@@ -3,13 +3,14 @@
 // stored.
 #pragma once
 
-#include "qm_rps/dialog/hingedialog.h"
+#include "qm_base/checkeddialog.h"
 #include "qm_rps/hinge/hingecontext.h"
+#include "qm_rps/hinge/hingefindings.h"
 #include "qm_rps/hinge/hingelabels.h"
 
 #include <functional>
 
-class CPO_HingeTypeDlg : public CHingeDialog {
+class CPO_HingeTypeDlg : public CCheckedDialog {
 public:
     struct T_SKCV_ENTRY {
         const char* key; // of its text

@@ -36,17 +36,17 @@ std::vector<std::string> CPO_HingeTypeDlg::InteractionTexts()
 
 std::string CPO_HingeTypeDlg::FieldOf(const T_FINDING& f)
 {
-    if (f.component < 0 || PartOf(f)) return f.field;
-    const std::string name = kComponentNames.at(static_cast<std::size_t>(f.component));
+    if (f.part < 0 || PartOf(f)) return f.field;
+    const std::string name = kComponentNames.at(static_cast<std::size_t>(f.part));
     return name + (f.field == "type" ? ".type" : ".curve");
 }
 
 int CPO_HingeTypeDlg::OnFinding(const T_FINDING& f)
 {
     if (const T_PART_EDITOR* part = PartOf(f)) return (this->*part->open)();
-    if (f.component < 0) return 0;
-    ShowPageOf(static_cast<HINGE_COMPONENT>(f.component));
-    return OnBtnSkcvProp(static_cast<HINGE_COMPONENT>(f.component));
+    if (f.part < 0) return 0;
+    ShowPageOf(ComponentOf(f));
+    return OnBtnSkcvProp(ComponentOf(f));
 }
 
 std::vector<CPO_HingeTypeDlg::T_PAGE> CPO_HingeTypeDlg::Pages() const
@@ -93,8 +93,8 @@ std::vector<T_FINDING> CPO_HingeTypeDlg::Findings() const
 {
     std::vector<T_FINDING> out;
     if (std::ranges::find(m_otherNames, m_type.name) != m_otherNames.end())
-        out.push_back(FindingOf(
-            {"IDS_QM_UI_HINGE_NAME_TAKEN", RULE_TEXT::Literal, nullptr, nullptr, "name"}, {}));
+        out.push_back(
+            FindingOf({.message = "IDS_QM_UI_HINGE_NAME_TAKEN", .field = "name"}, T_RULE_PLACE{}));
     for (T_FINDING& f : TypeFindings(m_type, m_context))
         out.push_back(std::move(f));
     return out;

@@ -50,13 +50,13 @@ constexpr auto kZMaxPos = MomentAbove0<&L::z, &T_YIELD_AXIS::momentMax, true>;
 constexpr auto kZMaxNeg = MomentAbove0<&L::z, &T_YIELD_AXIS::momentMax, false>;
 
 /// Head of the rule of a moment of the component's axis.
-constexpr T_RULE_HEAD Of(int component, const char* text, const char* field, HINGE_SIDE side)
+constexpr T_HINGE_HEAD Of(int component, const char* text, const char* field, HINGE_SIDE side)
 {
     return {kMsg, kLit, text, nullptr, field, side, "", "", nullptr, "", "", component};
 }
 
 // clang-format off
-const T_RULE<L> kCrackRules[] = {
+const T_HINGE_RULE<L> kCrackRules[] = {
     {{kMsg, kLit, "PC(t) > 0", nullptr, "tension"}, kTension},
     {{kMsg, kLit, "Pmax(c) > 0", nullptr, "compression"}, kPmax},
     {Of(kMy, "MCy(+) > 0", "y.moment.pos", kPos), kYPos, UsesY},
@@ -68,7 +68,7 @@ const T_RULE<L> kCrackRules[] = {
     {Of(kMy, "MYy,max(-) > 0", "y.momentMax.neg", kNeg), kYMaxNeg, UsesY},
     {Of(kMz, "MYz,max(-) > 0", "z.momentMax.neg", kNeg), kZMaxNeg, UsesZ},
 };
-const T_RULE<L> kYieldRules[] = {
+const T_HINGE_RULE<L> kYieldRules[] = {
     {{kMsg, kLit, "PY(t) > 0", nullptr, "tension"}, kTension},
     {{kMsg, kLit, "Pmax(c) > 0", nullptr, "compression"}, kPmax},
     {Of(kMy, "MYy(+) > 0", "y.moment.pos", kPos), kYPos, UsesY},
@@ -80,7 +80,7 @@ const T_RULE<L> kYieldRules[] = {
     {Of(kMy, "MUy,max(-) > 0", "y.momentMax.neg", kNeg), kYMaxNeg, UsesY},
     {Of(kMz, "MUz,max(-) > 0", "z.momentMax.neg", kNeg), kZMaxNeg, UsesZ},
 };
-const T_RULE<L> kEc8Rules[] = {
+const T_HINGE_RULE<L> kEc8Rules[] = {
     {{kMsg, kLit, "PC0(t) > 0", nullptr, "tension"}, kTension},
     {{kMsg, kLit, "Pmax(c) > 0", nullptr, "compression"}, kPmax},
     {Of(kMy, "MC0y(+) > 0", "y.moment.pos", kPos), kYPos, UsesY},
@@ -102,17 +102,17 @@ using P = T_POINT_CHECK;
 
 bool RatioInside(const P& c) { return Below(-1, c.now.m) && Below(c.now.m, 1); }
 bool Falls(const P& c) { return c.before ? Below(c.now.p, c.before->p) : std::isfinite(c.now.p); }
-const T_RULE<P> kRatioPos[] = {{{kMsg, kLit, "-1 < M/MY,max(+) < 1", nullptr, "m", kPos}, RatioInside}};
-const T_RULE<P> kRatioNeg[] = {{{kMsg, kLit, "-1 < M/MY,max(-) < 1", nullptr, "m", kNeg}, RatioInside}};
-const T_RULE<P> kFallTension[] = {{{kMsg, kLit, "P/Pmax(t)", nullptr, "p"}, Falls}};
-const T_RULE<P> kFallCompression[] = {{{kMsg, kLit, "P/Pmax(c)", nullptr, "p"}, Falls}};
+const T_HINGE_RULE<P> kRatioPos[] = {{{kMsg, kLit, "-1 < M/MY,max(+) < 1", nullptr, "m", kPos}, RatioInside}};
+const T_HINGE_RULE<P> kRatioNeg[] = {{{kMsg, kLit, "-1 < M/MY,max(-) < 1", nullptr, "m", kNeg}, RatioInside}};
+const T_HINGE_RULE<P> kFallTension[] = {{{kMsg, kLit, "P/Pmax(t)", nullptr, "p"}, Falls}};
+const T_HINGE_RULE<P> kFallCompression[] = {{{kMsg, kLit, "P/Pmax(c)", nullptr, "p"}, Falls}};
 // clang-format on
 
 /// A level with its name in the record and the rules of its strengths.
 struct T_LEVEL_VIEW {
     const char* prefix;
     const T_YIELD_LEVEL* level;
-    std::span<const T_RULE<L>> rules;
+    std::span<const T_HINGE_RULE<L>> rules;
 };
 
 /// A curve of a used axis.
@@ -137,18 +137,15 @@ std::vector<T_CURVE_VIEW> CurvesOf(const T_LEVEL_VIEW& view)
 }
 
 /// One rule on the points first ... first + count - 1 of a curve.
-void WalkPoints(std::span<const T_RULE<P>> rules, const T_CURVE_VIEW& v, std::size_t first,
+void WalkPoints(std::span<const T_HINGE_RULE<P>> rules, const T_CURVE_VIEW& v, std::size_t first,
                 std::size_t count, std::vector<T_FINDING>& out)
 {
     for (std::size_t i = first; i < first + count; ++i) {
         const P check{(*v.curve)[i], i == first ? nullptr : &(*v.curve)[i - 1]};
-        const std::size_t found = out.size();
         WalkRules(rules, check,
                   {v.component, HINGE_END::Both, -1, v.field + "[" + std::to_string(i) + "].",
                    kPmPointNames[i]},
                   out);
-        for (std::size_t k = found; k < out.size(); ++k)
-            out[k].side = v.side;
     }
 }
 

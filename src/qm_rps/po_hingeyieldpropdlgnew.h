@@ -1,11 +1,11 @@
 // Model of the editor of a hinge type's yield surface.
 #pragma once
 
+#include "qm_base/checkeddialog.h"
 #include "qm_db/records.h"
-#include "qm_rps/dialog/hingedialog.h"
 #include "qm_rps/hinge/hingelabels.h"
 
-class CPO_HingeYieldPropDlgNew : public CHingeDialog {
+class CPO_HingeYieldPropDlgNew : public CCheckedDialog {
 public:
     T_HINGE_OWNER m_owner; // for titles and units
 

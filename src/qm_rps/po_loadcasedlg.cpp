@@ -2,6 +2,7 @@
 
 #include "qm_base/appbase.h"
 #include "qm_base/msgfunction.h"
+#include "qm_base/ruletable.h"
 #include "qm_rps/hinge/hingesiderules.h"
 
 #include <algorithm>
@@ -18,7 +19,6 @@ struct T_CHECK {
     const std::function<bool(int)>& hasFunction;
 };
 using C = T_CHECK;
-constexpr auto kLit = RULE_TEXT::Literal;
 constexpr int kDisplacementControl = 1;
 constexpr int kFollowsFunction = 2;
 constexpr const char* kZeroFactor = "IDS_PUSHOVER_the_Scale_Factor_can_not_be_zero";
@@ -50,17 +50,17 @@ bool ByMaxDispl(const C& c)
 
 // clang-format off
 const T_RULE<C> kRules[] = {
-    {{"IDS_PUSHOVER_Error___Loadcase_name_is_not_input_", kLit, nullptr, nullptr, "name"}, [](const C& c) { return !c.data.name.empty(); }},
-    {{"IDS_RPS_PO_Error_No_Increment_Function", kLit, nullptr, nullptr, "control.incrementFunction"},
+    {{.message = "IDS_PUSHOVER_Error___Loadcase_name_is_not_input_", .field = "name"}, [](const C& c) { return !c.data.name.empty(); }},
+    {{.message = "IDS_RPS_PO_Error_No_Increment_Function", .field = "control.incrementFunction"},
      [](const C& c) { return c.hasFunction && c.hasFunction(c.c.incrementFunction); },
      [](const C& c) { return ByForce(c) && c.c.incrementOption == kFollowsFunction; }},
-    {{"IDS_RPS_PO_POLC_Current_Stif_Ratio_0", kLit, nullptr, nullptr, "control.stiffnessRatioLimit"}, [](const C& c) { return NotAbove(0, c.c.stiffnessRatioLimit); }, ByForce},
-    {{kAngle, kLit, nullptr, nullptr, "control.staticAngle"}, [](const C& c) { return Below(0, c.c.staticAngle); },
+    {{.message = "IDS_RPS_PO_POLC_Current_Stif_Ratio_0", .field = "control.stiffnessRatioLimit"}, [](const C& c) { return NotAbove(0, c.c.stiffnessRatioLimit); }, ByForce},
+    {{.message = kAngle, .field = "control.staticAngle"}, [](const C& c) { return Below(0, c.c.staticAngle); },
      [](const C& c) { return ByForce(c) && c.c.generateStaticAngle; }},
     // exactly 0 alone is refused: the sign gives the direction of the push
-    {{"IDS_PUSHOVER_Error___Master_Max_Displ__must_be_grea", kLit, nullptr, nullptr, "control.masterMaxDispl"},
+    {{.message = "IDS_PUSHOVER_Error___Master_Max_Displ__must_be_grea", .field = "control.masterMaxDispl"},
      [](const C& c) { return std::isfinite(c.c.masterMaxDispl) && c.c.masterMaxDispl != 0.0; }, ByMaster},
-    {{"IDS_PUSHOVER_Error___Max__Translational_Displ__must", kLit, nullptr, nullptr, "control.maxTransDispl"}, [](const C& c) { return Below(0, c.c.maxTransDispl); }, ByMaxDispl},
+    {{.message = "IDS_PUSHOVER_Error___Max__Translational_Displ__must", .field = "control.maxTransDispl"}, [](const C& c) { return Below(0, c.c.maxTransDispl); }, ByMaxDispl},
 };
 // clang-format on
 
@@ -127,7 +127,7 @@ std::vector<T_FINDING> CPO_LoadCaseDlg::Findings() const
     const T_POLC_CONTROL none;
     const T_CHECK check{m_case, m_case.control ? *m_case.control : none, m_hasIncrementFunction};
     std::vector<T_FINDING> out;
-    WalkRules(std::span<const T_RULE<C>>(kRules), check, {}, out);
+    WalkRules(kRules, check, {}, out);
     for (T_FINDING& f : out)
         if (f.messageKey == kAngle) f.ruleText = f.text += " >0"; // "%s >0"
     if (Doc()) DocFindings(out);
@@ -141,7 +141,7 @@ std::vector<T_FINDING> CPO_LoadCaseDlg::PatternFindings(const std::vector<T_POLC
         const T_POLC_PATTERN& r = rows[i];
         const std::string field = "patterns[" + std::to_string(i) + "]";
         const auto report = [&](bool wrong, const char* key) {
-            if (wrong) out.push_back(FindingOf({key, kLit, nullptr, nullptr, field.c_str()}, {}));
+            if (wrong) out.push_back(FindingOf({.message = key, .field = field.c_str()}, {}));
         };
         report(!ValidFactor(r.factor), kZeroFactor);
         report(IsMode(r.kind) && r.number <= 0, kZeroMode);

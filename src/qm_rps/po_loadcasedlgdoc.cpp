@@ -1,5 +1,6 @@
 // The load case dialog on a document: which case it edits, what the document asks of it, storing.
 #include "qm_base/msgfunction.h"
+#include "qm_base/ruletable.h"
 #include "qm_rps/po_loadcasedlg.h"
 
 #include <algorithm>
@@ -8,11 +9,10 @@ using zql::lib::MMSGFunction;
 
 namespace {
 
-constexpr auto kLit = RULE_TEXT::Literal;
-constexpr T_RULE_HEAD kNameTaken{"IDS_QM_UI_POLC_NAME_TAKEN", kLit, nullptr, nullptr, "name"};
-constexpr T_RULE_HEAD kNoNode{"IDS_QM_UI_POLC_NO_NODE", kLit, nullptr, nullptr, "controlNode"};
-constexpr T_RULE_HEAD kNoResult{"IDS_QM_UI_POLC_NO_RESULT", kLit, nullptr, nullptr, "controlNode"};
-constexpr T_RULE_HEAD kNoControl{"IDS_QM_UI_POLC_NO_CONTROL", kLit, nullptr, nullptr, "hasControl"};
+constexpr T_RULE_HEAD kNameTaken{.message = "IDS_QM_UI_POLC_NAME_TAKEN", .field = "name"};
+constexpr T_RULE_HEAD kNoNode{.message = "IDS_QM_UI_POLC_NO_NODE", .field = "controlNode"};
+constexpr T_RULE_HEAD kNoResult{.message = "IDS_QM_UI_POLC_NO_RESULT", .field = "controlNode"};
+constexpr T_RULE_HEAD kNoControl{.message = "IDS_QM_UI_POLC_NO_CONTROL", .field = "hasControl"};
 
 // Kinds of pattern rows.
 constexpr int kStatic = 0, kAcceleration = 1;
@@ -112,10 +112,10 @@ void CPO_LoadCaseDlg::DocFindings(std::vector<T_FINDING>& out) const
         const std::string field = "patterns[" + std::to_string(i) + "]";
         const bool isMode = row.kind > kAcceleration;
         report(isMode && !model.modes.empty() && !model.modes.contains(row.number),
-               {"IDS_QM_UI_POLC_NO_MODE", kLit, nullptr, nullptr, field.c_str()});
+               {.message = "IDS_QM_UI_POLC_NO_MODE", .field = field.c_str()});
         report(row.kind == kStatic && !model.loadCases.empty() &&
                    !model.loadCases.contains(row.number),
-               {"IDS_QM_UI_POLC_NO_CASE", kLit, nullptr, nullptr, field.c_str()});
+               {.message = "IDS_QM_UI_POLC_NO_CASE", .field = field.c_str()});
     }
 }
 

@@ -5,7 +5,7 @@
 // last picture and values, with the reason.
 #pragma once
 
-#include "qm_rps/hinge/hingefindings.h"
+#include "qm_base/finding.h"
 #include "qm_rps/pushover/pushovercells.h"
 #include "qm_rps/pushovercurvedlg.h"
 

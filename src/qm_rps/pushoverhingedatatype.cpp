@@ -14,7 +14,7 @@ constexpr const char* kAcceptance = "IDS_PUSHOVER_Wrong_Data_in_Acceptance_Crite
 
 // clang-format off
 /// A is the origin: B does not lie before it, in either measure.
-const T_RULE<B> kFromOrigin[] = {
+const T_HINGE_RULE<B> kFromOrigin[] = {
     {{kDiagram, RULE_TEXT::Deform, "%s(A) <= %s(B)", nullptr, "sides.pos.B.deform", HINGE_SIDE::Positive, "B"},
      [](const B& b) { return NotAbove(0, b.pos.B.deform); }},
     {{kDiagram, RULE_TEXT::Deform, "%s(-B) <= %s(A)", nullptr, "sides.neg.B.deform", HINGE_SIDE::Negative, "B"},
@@ -23,7 +23,7 @@ const T_RULE<B> kFromOrigin[] = {
 // clang-format on
 
 /// Rules of the FEMA curve under the message of a table.
-void Walk(T_BACKBONE_RULES rules, const B& data, const T_PLACE& place, const char* key,
+void Walk(T_BACKBONE_RULES rules, const B& data, const T_HINGE_PLACE& place, const char* key,
           std::vector<T_FINDING>& out)
 {
     const std::size_t first = out.size();
@@ -139,7 +139,7 @@ std::vector<T_FINDING> CPushOverHingeDataType::Findings() const
                  f.strengthLoss,  f.autoYield,     f.measure == SKEL_MEASURE::DDy,
                  f.initStiffness, f.asymStiffness, &f,
                  f.compliance};
-    const T_PLACE place{static_cast<int>(m_component)};
+    const T_HINGE_PLACE place{static_cast<int>(m_component)};
     for (const T_BACKBONE_RULES& rules : {PositiveSignRules(), NegativeSignRules(),
                                           T_BACKBONE_RULES(kFromOrigin), FemaOrderRules()})
         Walk(rules, data, place, kDiagram, out);

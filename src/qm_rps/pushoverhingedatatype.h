@@ -3,15 +3,15 @@
 // Units: as the type's. Signs: the negative side holds negative numbers.
 #pragma once
 
+#include "qm_base/checkeddialog.h"
 #include "qm_db/records.h"
-#include "qm_rps/dialog/hingedialog.h"
 #include "qm_rps/hinge/hingelabels.h"
 #include "qm_rps/hinge/hingesiderules.h"
 
 #include <functional>
 #include <optional>
 
-class CPushOverHingeDataType : public CHingeDialog {
+class CPushOverHingeDataType : public CCheckedDialog {
 public:
     /// Names of the rows of the diagram.
     static constexpr std::array<const char*, 9> kRows{"-E", "-D", "-C", "-B", "A",

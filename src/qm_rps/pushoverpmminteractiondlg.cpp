@@ -17,11 +17,11 @@ struct T_POINT_CHECK {
 using P = T_POINT_CHECK;
 
 // clang-format off
-const T_RULE<P> kPoint[] = {
+const T_HINGE_RULE<P> kPoint[] = {
     {{kCurve, kLit, "P/Pmax", nullptr, "p"}, [](const P& c) { return c.before ? NotAbove(c.now.p, c.before->p) : std::isfinite(c.now.p); }},
     {{kCurve, kLit, "M/Mmax", nullptr, "m"}, [](const P& c) { return c.before ? NotAbove(c.now.m, c.before->m) : std::isfinite(c.now.m); }},
 };
-const T_RULE<T_PMM_TABLE> kTable[] = {
+const T_HINGE_RULE<T_PMM_TABLE> kTable[] = {
     {{"IDS_PUSHOVER_PMAX_POS", kLit, "Pmax >= 0", nullptr, "Pmax"}, [](const T_PMM_TABLE& t) { return NotAbove(0, t.Pmax); }},
 };
 // clang-format on
@@ -34,12 +34,12 @@ std::vector<T_FINDING> CPushOverPMMInteractionDlg::Findings() const
     for (std::size_t c = 0; c < m_table.curves.size(); ++c)
         for (std::size_t i = 0; i < m_table.curves[c].size(); ++i) {
             const P check{m_table.curves[c][i], i ? &m_table.curves[c][i - 1] : nullptr};
-            WalkRules(std::span<const T_RULE<P>>(kPoint), check,
+            WalkRules(kPoint, check,
                       {-1, HINGE_END::Both, -1, FormatText("curves[%zu][%zu].", c, i),
                        std::to_string(i + 1)},
                       out);
         }
-    WalkRules(std::span<const T_RULE<T_PMM_TABLE>>(kTable), m_table, {}, out);
+    WalkRules(kTable, m_table, {}, out);
     return out;
 }
 

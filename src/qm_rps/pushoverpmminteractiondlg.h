@@ -1,11 +1,11 @@
 // Model of the dialog of user-defined P-M interaction curves.
 #pragma once
 
+#include "qm_base/checkeddialog.h"
 #include "qm_db/records.h"
-#include "qm_rps/dialog/hingedialog.h"
 #include "qm_rps/hinge/hingelabels.h"
 
-class CPushOverPMMInteractionDlg : public CHingeDialog {
+class CPushOverPMMInteractionDlg : public CCheckedDialog {
 public:
     T_HINGE_OWNER m_owner; // for titles and units
 

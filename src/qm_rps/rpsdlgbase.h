@@ -1,8 +1,8 @@
 // Base of the dialogs that are opened on a document, modal or not.
 #pragma once
 
+#include "qm_base/checkeddialog.h"
 #include "qm_db/dbdoc.h"
-#include "qm_rps/dialog/hingedialog.h"
 
 #include <functional>
 #include <memory>
@@ -21,7 +21,7 @@ public:
 };
 
 /// State: the document that it works on, and its window where it is modeless.
-class CRPSDlgBase : public CHingeDialog {
+class CRPSDlgBase : public CCheckedDialog {
 public:
     /// Makes the window of a modeless dialog, over the parent; null: it can't be made.
     using WINDOW_MAKER = std::function<std::unique_ptr<IRPSWindow>(CRPSDlgBase& dialog, int id,

@@ -2,11 +2,11 @@
 // construction stages: name, objective, sign, constraints, and what a calculation leaves.
 #pragma once
 
-#include "qm_rps/dialog/hingedialog.h"
+#include "qm_base/checkeddialog.h"
 #include "qm_rps/factors/ulfanalysis.h"
 #include "qm_rps/factors/ulfexplain.h"
 
-class CUlfItemDialog : public CHingeDialog {
+class CUlfItemDialog : public CCheckedDialog {
 public:
     /// Texts of the choices, by index.
     static constexpr std::array<const char*, 3> kObjectiveKeys{

@@ -2,10 +2,10 @@
 // units.
 #pragma once
 
+#include "qm_base/checkeddialog.h"
 #include "qm_db/dbdoc.h"
-#include "qm_rps/dialog/hingedialog.h"
 
-class CUnknownLoadFactorConstraintDlg : public CHingeDialog {
+class CUnknownLoadFactorConstraintDlg : public CCheckedDialog {
 public:
     /// Texts of the types, by code; of the place that an equality is compared with, likewise.
     static constexpr std::array<const char*, 4> kTypeKeys{"IDS_QM_ULFC_REACTION",

@@ -99,8 +99,8 @@ TEST(HingeEditors, FindingsOfATypeNameThePartOfTheEditorTheyBelongTo)
     const auto field = [](const char* path, int component, HINGE_END end = HINGE_END::Both) {
         T_FINDING f;
         f.field = path;
-        f.component = component;
-        f.end = end;
+        f.part = component;
+        f.page = static_cast<int>(end);
         return CPO_HingeTypeDlg::FieldOf(f) + " " + PathInType(f);
     };
     EXPECT_EQ("name name", field("name", -1));

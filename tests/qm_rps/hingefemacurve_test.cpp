@@ -143,7 +143,7 @@ TEST(HingeFemaCurve, ShowsTheFirstFindingAndWritesNothing)
     EXPECT_EQ(before, data);
     const auto found = dlg.Findings();
     ASSERT_EQ(2u, found.size());
-    EXPECT_EQ(HINGE_END::J, found[0].end);
+    EXPECT_EQ(HINGE_END::J, EndOf(found[0]));
     EXPECT_EQ("Hinge properties of component My are wrong. This rule is not kept: M(B) > 0.",
               dlg.Messages().at(0).text);
     dlg.Component(kMy)->active = false;

@@ -139,7 +139,7 @@ TEST(HingeType, ReportsEveryFindingAndRefusesAsAWhole)
     EXPECT_EQ(before, stored);
     const auto found = dlg.Findings();
     ASSERT_EQ(2u, found.size());
-    EXPECT_EQ(HINGE_END::J, found[1].end);
+    EXPECT_EQ(HINGE_END::J, EndOf(found[1]));
     EXPECT_EQ(found[0].text, dlg.Messages().back().text);
     dlg.OnComponentCtrl(C::Fx, false);
     dlg.OnLocationCtrl(C::My, HINGE_LOCATION::IEnd); // the J-end has no hinge

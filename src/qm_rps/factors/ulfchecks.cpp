@@ -10,9 +10,6 @@ using zql::lib::MMSGFunction;
 
 namespace {
 
-constexpr auto kKey = RULE_TEXT::Key;
-constexpr auto kLit = RULE_TEXT::Literal;
-
 template <class T>
 bool NameTaken(const T_TABLE<T>& table, const std::string& name, int ownKey)
 {
@@ -67,34 +64,34 @@ bool Finite(const std::optional<double>& value)
 
 // clang-format off
 const T_RULE<C> kConstraintRules[] = {
-    {{"IDS_RPS_No_Constraint_Name_", kLit, nullptr, nullptr, "name"}, [](const C& k) { return !k.c.name.empty(); }},
-    {{kUlfConstraintError, kKey, "IDS_QM_ULFC_NAME_EXISTS", nullptr, "name"},
+    {{.message = "IDS_RPS_No_Constraint_Name_", .field = "name"}, [](const C& k) { return !k.c.name.empty(); }},
+    {{.message = kUlfConstraintError, .key = "IDS_QM_ULFC_NAME_EXISTS", .field = "name"},
      [](const C& k) { return k.c.name.empty() || !NameTaken(k.model.ulfConstraints, k.c.name, k.ownKey); }},
-    {{kUlfConstraintError, kKey, "IDS_QM_ULFC_TYPE", nullptr, "type"}, KnownType},
-    {{"IDS_RPS_the_Node_Id_doesn_t_exist", kLit, nullptr, nullptr, "id"}, [](const C& k) { return k.model.nodes.contains(k.c.id); }, OfNode},
-    {{"IDS_RPS_the_Elem_Id_doesn_t_exist", kLit, nullptr, nullptr, "id"}, [](const C& k) { return k.model.elements.contains(k.c.id); }, OfElem},
-    {{"IDS_RPS_Elem_Id_is_not_of_Truss_", kLit, nullptr, nullptr, "id"}, [](const C& k) { return IsKind(k, k.c.id, ELEM_KIND::Truss); }, OfTruss},
-    {{"IDS_RPS_Elem_Id_is_not_of_Beam_", kLit, nullptr, nullptr, "id"}, [](const C& k) { return IsKind(k, k.c.id, ELEM_KIND::Beam); }, OfBeam},
-    {{kUlfConstraintError, kKey, "IDS_QM_ULFC_POSITION", nullptr, "position"}, [](const C& k) { return k.c.position >= 0 && k.c.position <= 4; }, OfBeam},
+    {{.message = kUlfConstraintError, .key = "IDS_QM_ULFC_TYPE", .field = "type"}, KnownType},
+    {{.message = "IDS_RPS_the_Node_Id_doesn_t_exist", .field = "id"}, [](const C& k) { return k.model.nodes.contains(k.c.id); }, OfNode},
+    {{.message = "IDS_RPS_the_Elem_Id_doesn_t_exist", .field = "id"}, [](const C& k) { return k.model.elements.contains(k.c.id); }, OfElem},
+    {{.message = "IDS_RPS_Elem_Id_is_not_of_Truss_", .field = "id"}, [](const C& k) { return IsKind(k, k.c.id, ELEM_KIND::Truss); }, OfTruss},
+    {{.message = "IDS_RPS_Elem_Id_is_not_of_Beam_", .field = "id"}, [](const C& k) { return IsKind(k, k.c.id, ELEM_KIND::Beam); }, OfBeam},
+    {{.message = kUlfConstraintError, .key = "IDS_QM_ULFC_POSITION", .field = "position"}, [](const C& k) { return k.c.position >= 0 && k.c.position <= 4; }, OfBeam},
     // a truss carries its axial force alone
-    {{kUlfConstraintError, kKey, "IDS_QM_ULFC_COMPONENT", nullptr, "component"},
+    {{.message = kUlfConstraintError, .key = "IDS_QM_ULFC_COMPONENT", .field = "component"},
      [](const C& k) { return k.c.component >= 0 && k.c.component <= (OfTruss(k) ? 0 : 5); }, KnownType},
-    {{"IDS_RPS_the_Other_Node_Id_doesn_t_exist", kLit, nullptr, nullptr, "otherId"},
+    {{.message = "IDS_RPS_the_Other_Node_Id_doesn_t_exist", .field = "otherId"},
      [](const C& k) { return k.model.nodes.contains(k.c.otherId); }, [](const C& k) { return Compared(k) && OfNode(k); }},
-    {{"IDS_RPS_the_Other_Elem_Id_doesn_t_exist", kLit, nullptr, nullptr, "otherId"},
+    {{.message = "IDS_RPS_the_Other_Elem_Id_doesn_t_exist", .field = "otherId"},
      [](const C& k) { return k.model.elements.contains(k.c.otherId); }, [](const C& k) { return Compared(k) && OfElem(k); }},
-    {{"IDS_RPS_the_Other_Elem_Id_is_not_of_Truss_", kLit, nullptr, nullptr, "otherId"},
+    {{.message = "IDS_RPS_the_Other_Elem_Id_is_not_of_Truss_", .field = "otherId"},
      [](const C& k) { return IsKind(k, k.c.otherId, ELEM_KIND::Truss); }, [](const C& k) { return Compared(k) && OfTruss(k); }},
-    {{"IDS_RPS_the_Other_Elem_Id_is_not_of_Beam_", kLit, nullptr, nullptr, "otherId"},
+    {{.message = "IDS_RPS_the_Other_Elem_Id_is_not_of_Beam_", .field = "otherId"},
      [](const C& k) { return IsKind(k, k.c.otherId, ELEM_KIND::Beam); }, [](const C& k) { return Compared(k) && OfBeam(k); }},
-    {{kUlfConstraintError, kKey, "IDS_QM_ULFC_COMPARED_WITH_ITSELF", nullptr, "otherId"}, [](const C& k) { return k.c.otherId != k.c.id; }, Compared},
-    {{kUlfConstraintError, kKey, "IDS_QM_ULFC_VALUE", nullptr, "value"}, [](const C& k) { return std::isfinite(k.c.value); },
+    {{.message = kUlfConstraintError, .key = "IDS_QM_ULFC_COMPARED_WITH_ITSELF", .field = "otherId"}, [](const C& k) { return k.c.otherId != k.c.id; }, Compared},
+    {{.message = kUlfConstraintError, .key = "IDS_QM_ULFC_VALUE", .field = "value"}, [](const C& k) { return std::isfinite(k.c.value); },
      [](const C& k) { return !k.c.inequality && k.c.compareWithValue; }},
-    {{kUlfConstraintError, kKey, "IDS_QM_ULFC_NO_BOUND", nullptr, "upper"}, [](const C& k) { return k.c.upper || k.c.lower; },
+    {{.message = kUlfConstraintError, .key = "IDS_QM_ULFC_NO_BOUND", .field = "upper"}, [](const C& k) { return k.c.upper || k.c.lower; },
      [](const C& k) { return k.c.inequality; }},
-    {{kUlfConstraintError, kKey, "IDS_QM_ULFC_VALUE", nullptr, "upper"}, [](const C& k) { return Finite(k.c.upper); }, [](const C& k) { return k.c.inequality; }},
-    {{kUlfConstraintError, kKey, "IDS_QM_ULFC_VALUE", nullptr, "lower"}, [](const C& k) { return Finite(k.c.lower); }, [](const C& k) { return k.c.inequality; }},
-    {{kUlfConstraintError, kKey, "IDS_QM_ULFC_BOUNDS_CROSS", nullptr, "lower"}, [](const C& k) { return !(*k.c.lower > *k.c.upper); },
+    {{.message = kUlfConstraintError, .key = "IDS_QM_ULFC_VALUE", .field = "upper"}, [](const C& k) { return Finite(k.c.upper); }, [](const C& k) { return k.c.inequality; }},
+    {{.message = kUlfConstraintError, .key = "IDS_QM_ULFC_VALUE", .field = "lower"}, [](const C& k) { return Finite(k.c.lower); }, [](const C& k) { return k.c.inequality; }},
+    {{.message = kUlfConstraintError, .key = "IDS_QM_ULFC_BOUNDS_CROSS", .field = "lower"}, [](const C& k) { return !(*k.c.lower > *k.c.upper); },
      [](const C& k) { return k.c.inequality && k.c.upper && k.c.lower; }},
 };
 // clang-format on
@@ -128,25 +125,25 @@ bool AllDiffer(const std::vector<T>& list, KEY key)
 
 // clang-format off
 const T_RULE<I> kItemRules[] = {
-    {{"IDS_RPS_No_Item_Name_", kLit, nullptr, nullptr, "name"}, [](const I& k) { return !k.item.name.empty(); }},
-    {{kUlfItemError, kKey, "IDS_QM_ULFI_NAME_EXISTS", nullptr, "name"},
+    {{.message = "IDS_RPS_No_Item_Name_", .field = "name"}, [](const I& k) { return !k.item.name.empty(); }},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULFI_NAME_EXISTS", .field = "name"},
      [](const I& k) { return k.item.name.empty() || (!NameTaken(k.model.ulfItems, k.item.name, k.ownKey) && !NameTaken(k.model.ulfStageItems, k.item.name, 0)); }},
-    {{"IDS_RPS_No_General_Load_Combination_exist_", kLit, nullptr, nullptr, "combination"}, HasCombinations},
-    {{kUlfItemError, kKey, "IDS_QM_ULFI_COMBINATION", nullptr, "combination"}, [](const I& k) { return k.cases.has_value(); }, HasCombinations},
-    {{kUlfItemError, kKey, "IDS_QM_ULFI_OBJECTIVE", nullptr, "objective"}, [](const I& k) { return k.item.objective >= 0 && k.item.objective <= 2; }},
-    {{kUlfItemError, kKey, "IDS_QM_ULFI_SIGN", nullptr, "sign"}, [](const I& k) { return k.item.sign >= 0 && k.item.sign <= 2; }},
-    {{"IDS_RPS_No_Unknown_Load_Factor_defined_", kLit, nullptr, nullptr, "unknowns"}, [](const I& k) { return !k.item.unknowns.empty(); }},
-    {{kUlfItemError, kKey, "IDS_QM_ULFI_NOT_IN_COMBINATION", nullptr, "unknowns"},
+    {{.message = "IDS_RPS_No_General_Load_Combination_exist_", .field = "combination"}, HasCombinations},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULFI_COMBINATION", .field = "combination"}, [](const I& k) { return k.cases.has_value(); }, HasCombinations},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULFI_OBJECTIVE", .field = "objective"}, [](const I& k) { return k.item.objective >= 0 && k.item.objective <= 2; }},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULFI_SIGN", .field = "sign"}, [](const I& k) { return k.item.sign >= 0 && k.item.sign <= 2; }},
+    {{.message = "IDS_RPS_No_Unknown_Load_Factor_defined_", .field = "unknowns"}, [](const I& k) { return !k.item.unknowns.empty(); }},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULFI_NOT_IN_COMBINATION", .field = "unknowns"},
      [](const I& k) { return std::all_of(k.item.unknowns.begin(), k.item.unknowns.end(), [&](const T_ULFI_UNKNOWN& u) { return InCombination(k, u.loadCase); }); },
      [](const I& k) { return k.cases.has_value(); }},
-    {{kUlfItemError, kKey, "IDS_QM_ULFI_TWICE", nullptr, "unknowns"},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULFI_TWICE", .field = "unknowns"},
      [](const I& k) { return AllDiffer(k.item.unknowns, [](const T_ULFI_UNKNOWN& u) { return u.loadCase; }); }},
-    {{kUlfItemError, kKey, "IDS_QM_ULFI_WEIGHT", nullptr, "unknowns"},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULFI_WEIGHT", .field = "unknowns"},
      [](const I& k) { return std::all_of(k.item.unknowns.begin(), k.item.unknowns.end(), [](const T_ULFI_UNKNOWN& u) { return std::isfinite(u.weight) && u.weight >= 0; }); }},
-    {{"IDS_RPS_No_constraint_defined_for_the_unknowns_", kLit, nullptr, nullptr, "constraints"}, [](const I& k) { return !k.item.constraints.empty(); }},
-    {{kUlfItemError, kKey, "IDS_QM_ULFI_NO_SUCH_CONSTRAINT", nullptr, "constraints"},
+    {{.message = "IDS_RPS_No_constraint_defined_for_the_unknowns_", .field = "constraints"}, [](const I& k) { return !k.item.constraints.empty(); }},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULFI_NO_SUCH_CONSTRAINT", .field = "constraints"},
      [](const I& k) { return std::all_of(k.item.constraints.begin(), k.item.constraints.end(), [&](const std::string& n) { return FindUlfConstraint(k.model, n) != 0; }); }},
-    {{kUlfItemError, kKey, "IDS_QM_ULFI_TWICE", nullptr, "constraints"},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULFI_TWICE", .field = "constraints"},
      [](const I& k) { return AllDiffer(k.item.constraints, [](const std::string& n) { return n; }); }},
 };
 // clang-format on
@@ -167,7 +164,7 @@ std::vector<T_FINDING> CheckUlfConstraint(const T_ULFC_D& constraint, int ownKey
                                           const T_MODEL& model)
 {
     std::vector<T_FINDING> out;
-    WalkRules(std::span<const T_RULE<C>>(kConstraintRules), {constraint, model, ownKey}, {}, out);
+    WalkRules(kConstraintRules, {constraint, model, ownKey}, {}, out);
     FillTexts(out, constraint.name, constraint.id, constraint.otherId);
     return out;
 }
@@ -176,7 +173,7 @@ std::vector<T_FINDING> CheckUlfItem(const T_ULFI_D& item, int ownKey, const T_MO
                                     const std::optional<std::vector<T_LCOM_ITEM>>& cases)
 {
     std::vector<T_FINDING> out;
-    WalkRules(std::span<const T_RULE<I>>(kItemRules), {item, model, ownKey, cases}, {}, out);
+    WalkRules(kItemRules, {item, model, ownKey, cases}, {}, out);
     FillTexts(out, item.name);
     for (const std::string& name : item.constraints)
         AddConstraintFindings(name, model, out);

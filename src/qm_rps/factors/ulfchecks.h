@@ -1,8 +1,8 @@
 // Rules of unknown load factor items and constraints: everything that is wrong with a record.
 #pragma once
 
+#include "qm_base/ruletable.h"
 #include "qm_db/records.h"
-#include "qm_rps/hinge/hingefindings.h"
 
 #include <optional>
 

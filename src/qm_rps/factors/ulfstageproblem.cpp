@@ -26,8 +26,6 @@ struct T_ROW_CHECK {
 };
 using I = T_ITEM_CHECK;
 using R = T_ROW_CHECK;
-constexpr auto kKey = RULE_TEXT::Key;
-constexpr auto kLit = RULE_TEXT::Literal;
 
 bool NameIsFree(const I& k)
 {
@@ -82,27 +80,27 @@ bool ConstraintPlacesExist(const I& k)
 
 // clang-format off
 const T_RULE<I> kNameRules[] = {
-    {{"IDS_RPS_No_Item_Name_", kLit, nullptr, nullptr, "name"}, [](const I& k) { return !k.item.name.empty(); }},
-    {{kUlfItemError, kKey, "IDS_QM_ULFI_NAME_EXISTS", nullptr, "name"}, NameIsFree, [](const I& k) { return !k.item.name.empty(); }},
+    {{.message = "IDS_RPS_No_Item_Name_", .field = "name"}, [](const I& k) { return !k.item.name.empty(); }},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULFI_NAME_EXISTS", .field = "name"}, NameIsFree, [](const I& k) { return !k.item.name.empty(); }},
 };
 const T_RULE<R> kRowRules[] = {
-    {{kUlfItemError, kKey, "IDS_QM_ULSI_PLACE", nullptr, "step"}, [](const R& k) { return UlfStepNumber(k.model, k.row.stage, k.row.step) != 0; }},
-    {{kUlfItemError, kKey, "IDS_QM_ULSI_CASE", nullptr, "case"}, [](const R& k) { return k.model.loadCases.contains(k.row.loadCase); }},
-    {{kUlfItemError, kKey, "IDS_QM_ULSI_GROUP", nullptr, "load_group"}, [](const R& k) { return k.row.loadGroup >= kLoadGroupDead && k.row.loadGroup <= kLoadGroupRest; }},
-    {{kUlfItemError, kKey, "IDS_QM_ULSI_NUMBER", nullptr, "factor"}, NumbersAreFinite},
-    {{kUlfItemError, kKey, "IDS_QM_ULSI_TWICE", nullptr, "case"}, [](const R& k) { return !k.twice; }},
-    {{kUlfItemError, kKey, "IDS_QM_ULSI_NO_PRETENSION", nullptr, "pretension"}, PretensionIsThere},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULSI_PLACE", .field = "step"}, [](const R& k) { return UlfStepNumber(k.model, k.row.stage, k.row.step) != 0; }},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULSI_CASE", .field = "case"}, [](const R& k) { return k.model.loadCases.contains(k.row.loadCase); }},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULSI_GROUP", .field = "load_group"}, [](const R& k) { return k.row.loadGroup >= kLoadGroupDead && k.row.loadGroup <= kLoadGroupRest; }},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULSI_NUMBER", .field = "factor"}, NumbersAreFinite},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULSI_TWICE", .field = "case"}, [](const R& k) { return !k.twice; }},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULSI_NO_PRETENSION", .field = "pretension"}, PretensionIsThere},
     // Scaled by two unknowns, a load would get both factors.
-    {{kUlfItemError, kKey, "IDS_QM_ULSI_SCALED_TWICE", nullptr, "pretension"}, [](const R& k) { return !k.shared; }},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULSI_SCALED_TWICE", .field = "pretension"}, [](const R& k) { return !k.shared; }},
 };
 const T_RULE<I> kRules[] = {
-    {{kUlfItemError, kKey, "IDS_QM_ULFI_OBJECTIVE", nullptr, "objective"}, [](const I& k) { return k.item.objective >= 0 && k.item.objective <= 2; }},
-    {{kUlfItemError, kKey, "IDS_QM_ULFI_SIGN", nullptr, "sign"}, [](const I& k) { return k.item.sign >= 0 && k.item.sign <= 2; }},
-    {{"IDS_RPS_No_Unknown_Load_Factor_defined_", kLit, nullptr, nullptr, "rows"}, HasUnknown},
-    {{"IDS_RPS_No_constraint_defined_for_the_unknowns_", kLit, nullptr, nullptr, "constraints"}, [](const I& k) { return !k.item.constraints.empty(); }},
-    {{kUlfItemError, kKey, "IDS_QM_ULFI_NO_SUCH_CONSTRAINT", nullptr, "constraints"}, ConstraintsExist},
-    {{kUlfItemError, kKey, "IDS_QM_ULFI_TWICE", nullptr, "constraints"}, ConstraintsDiffer},
-    {{kUlfItemError, kKey, "IDS_QM_ULSI_CONSTRAINT_PLACE", nullptr, "constraints"}, ConstraintPlacesExist},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULFI_OBJECTIVE", .field = "objective"}, [](const I& k) { return k.item.objective >= 0 && k.item.objective <= 2; }},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULFI_SIGN", .field = "sign"}, [](const I& k) { return k.item.sign >= 0 && k.item.sign <= 2; }},
+    {{.message = "IDS_RPS_No_Unknown_Load_Factor_defined_", .field = "rows"}, HasUnknown},
+    {{.message = "IDS_RPS_No_constraint_defined_for_the_unknowns_", .field = "constraints"}, [](const I& k) { return !k.item.constraints.empty(); }},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULFI_NO_SUCH_CONSTRAINT", .field = "constraints"}, ConstraintsExist},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULFI_TWICE", .field = "constraints"}, ConstraintsDiffer},
+    {{.message = kUlfItemError, .key = "IDS_QM_ULSI_CONSTRAINT_PLACE", .field = "constraints"}, ConstraintPlacesExist},
 };
 // clang-format on
 
@@ -122,8 +120,7 @@ void CheckRows(const T_ULSI_D& item, const CDataCtrl& data, std::vector<T_FINDIN
             if (HasPretension(model, load)) check.shared |= !scaled.insert(load).second;
         const std::string number = std::to_string(i + 1);
         std::vector<T_FINDING> found;
-        WalkRules(std::span<const T_RULE<R>>(kRowRules), check,
-                  {-1, {}, -1, "rows[" + number + "]."}, found);
+        WalkRules(kRowRules, check, {.prefix = "rows[" + number + "]."}, found);
         for (T_FINDING& f : found) {
             const std::string rule =
                 MMSGFunction::Format("IDS_QM_ULSI_ROW", {number, UlfStageRowText(data, row),

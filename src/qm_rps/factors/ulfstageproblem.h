@@ -1,10 +1,10 @@
 // From a construction-stage item and its constraints to the optimizer's records, and its rules.
 #pragma once
 
+#include "qm_base/ruletable.h"
 #include "qm_db/datactrl.h"
 #include "qm_rps/factors/ulfrecords.h"
 #include "qm_rps/factors/ulfstageresponse.h"
-#include "qm_rps/hinge/hingefindings.h"
 
 /// As of a static problem; its cases are the rows of the item.
 struct T_ULF_STAGE_FORMED : T_ULF_FORMED {

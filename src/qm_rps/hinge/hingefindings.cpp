@@ -21,7 +21,7 @@ const char* SymbolOf(RULE_TEXT kind, int component)
 
 } // namespace
 
-T_FINDING FindingOf(const T_RULE_HEAD& head, const T_PLACE& place)
+T_FINDING FindingOf(const T_HINGE_HEAD& head, const T_HINGE_PLACE& place)
 {
     const int component = head.component >= 0 ? head.component : place.component;
     const char* symbol = SymbolOf(head.kind, component);
@@ -32,9 +32,8 @@ T_FINDING FindingOf(const T_RULE_HEAD& head, const T_PLACE& place)
     T_FINDING f;
     f.field = place.prefix + list + head.field;
     f.messageKey = head.messageKey;
-    f.component = component;
-    f.end = place.end;
-    f.side = head.side;
+    f.part = component;
+    f.page = static_cast<int>(place.end);
     f.point = *head.point ? head.point : place.point;
     if (!text)
         f.ruleText = head.messageKey;
@@ -54,14 +53,13 @@ T_FINDING FindingOf(const T_RULE_HEAD& head, const T_PLACE& place)
 
 std::string PathOnPages(const T_FINDING& f)
 {
-    return f.end == HINGE_END::J ? "J." + f.field : f.field;
+    return EndOf(f) == HINGE_END::J ? "J." + f.field : f.field;
 }
 
 std::string PathInType(const T_FINDING& f)
 {
-    if (f.component < 0) return f.field;
-    return std::string(kComponentNames.at(static_cast<std::size_t>(f.component))) + "." +
-           PathOnPages(f);
+    if (f.part < 0) return f.field;
+    return std::string(kComponentNames.at(static_cast<std::size_t>(f.part))) + "." + PathOnPages(f);
 }
 
 const char* PageTitleKey(const T_HINGE_COMPONENT& c, HINGE_END end)

@@ -1,31 +1,17 @@
-// Rules of hinge editors as table rows, one walker over them, and what they find.
+// Rules of hinge records as table rows, and where in a hinge type a finding stands.
 #pragma once
 
+#include "qm_base/ruletable.h"
 #include "qm_db/records.h"
 
-#include <span>
 #include <string>
 #include <vector>
 
 enum class HINGE_END { Both, I, J };
 enum class HINGE_SIDE { None, Positive, Negative };
 
-/// One rule that is not kept.
-struct T_FINDING {
-    std::string field;      // path in the record of the curve or dialog: "sides.pos.B.strength"
-    std::string ruleText;   // the rule as the program words it, "F(B) > 0", or the item's key
-    std::string messageKey; // of the message that reports it
-    std::string text;       // that message, filled in
-    std::string wording;    // the relation in words, where a catalogue text has it
-    int component = -1;     // HINGE_COMPONENT; -1: not of a component
-    HINGE_END end = HINGE_END::Both;
-    HINGE_SIDE side = HINGE_SIDE::None;
-    std::string point; // "B" to "E", "IO" ...; empty: no point
-    bool operator==(const T_FINDING&) const = default;
-};
-
 /// Where a curve stands. curve: its index in the list by axial force; -1: no list.
-struct T_PLACE {
+struct T_HINGE_PLACE {
     int component = -1;
     HINGE_END end = HINGE_END::Both;
     int curve = -1;
@@ -38,7 +24,8 @@ struct T_PLACE {
 enum class RULE_TEXT { Literal, Deform, Strength, Key };
 
 /// All of a rule but its condition.
-struct T_RULE_HEAD {
+struct T_HINGE_HEAD {
+    using PLACE = T_HINGE_PLACE;
     const char* messageKey; // {1} component, {2} rule
     RULE_TEXT kind;
     const char* text;       // null: the message says it all
@@ -53,30 +40,26 @@ struct T_RULE_HEAD {
 };
 
 template <class DATA>
-struct T_RULE {
-    T_RULE_HEAD head;
-    bool (*holds)(const DATA&);             // must be false for a NaN
-    bool (*applies)(const DATA&) = nullptr; // null: always
-};
+using T_HINGE_RULE = T_RULE<DATA, T_HINGE_HEAD>;
 
 /// The finding of a rule that is not kept.
-T_FINDING FindingOf(const T_RULE_HEAD& head, const T_PLACE& place);
+T_FINDING FindingOf(const T_HINGE_HEAD& head, const T_HINGE_PLACE& place);
+
+/// The component and the end of a finding; it must have a component (part).
+inline HINGE_COMPONENT ComponentOf(const T_FINDING& f)
+{
+    return static_cast<HINGE_COMPONENT>(f.part);
+}
+inline HINGE_END EndOf(const T_FINDING& f)
+{
+    return static_cast<HINGE_END>(f.page);
+}
 
 /// Where the finding stands in a hinge type: "My.sides.pos.B.strength", of the J-end
 /// "My.J.sides.pos.B.strength"; the field alone where it is of no component.
 std::string PathInType(const T_FINDING& f);
 /// Where it stands on the pages of one component: of the J-end "J.sides.pos.B.strength".
 std::string PathOnPages(const T_FINDING& f);
-
-/// The walker: appends what is not kept, in the order of the table.
-template <class DATA>
-void WalkRules(std::span<const T_RULE<DATA>> rules, const DATA& data, const T_PLACE& place,
-               std::vector<T_FINDING>& out)
-{
-    for (const T_RULE<DATA>& r : rules)
-        if ((!r.applies || r.applies(data)) && !r.holds(data))
-            out.push_back(FindingOf(r.head, place));
-}
 
 inline constexpr const char* kHingeRuleMessage =
     "IDS_RPS_Error_Pushove_Hinge_Properties_DOF_s_contains_ERROR";

@@ -57,7 +57,7 @@ constexpr T_MIRROR_FIELD<M> kMultiFields[] = {
 /// Compares the stored negative side with what symmetry makes of the positive one.
 template <class SIDE, std::size_t N>
 void Compare(const T_MIRROR_FIELD<SIDE> (&fields)[N], const SIDE& stored, const SIDE& mirrored,
-             const T_PLACE& place, std::vector<T_FINDING>& out)
+             const T_HINGE_PLACE& place, std::vector<T_FINDING>& out)
 {
     bool leftOut = true;
     for (const T_MIRROR_FIELD<SIDE>& f : fields)
@@ -74,7 +74,7 @@ void Compare(const T_MIRROR_FIELD<SIDE> (&fields)[N], const SIDE& stored, const 
 
 /// The sides of a curve by itself, then those of its axial forces.
 template <class CURVE>
-void CompareCurve(const CURVE& curve, const T_PLACE& place, std::vector<T_FINDING>& out)
+void CompareCurve(const CURVE& curve, const T_HINGE_PLACE& place, std::vector<T_FINDING>& out)
 {
     if (!curve.symmetric) return;
     CURVE mirrored = curve;
@@ -85,7 +85,7 @@ void CompareCurve(const CURVE& curve, const T_PLACE& place, std::vector<T_FINDIN
         Compare(kBackboneFields, curve.sides.neg, mirrored.sides.neg, place, out);
     }
     if constexpr (std::is_same_v<CURVE, T_SKEL_FEMA>) {
-        T_PLACE at = place;
+        T_HINGE_PLACE at = place;
         for (std::size_t i = 0; i < curve.curves.size(); ++i) {
             at.curve = static_cast<int>(i);
             Compare(kBackboneFields, curve.curves[i].sides.neg, mirrored.curves[i].sides.neg, at,
@@ -96,7 +96,8 @@ void CompareCurve(const CURVE& curve, const T_PLACE& place, std::vector<T_FINDIN
 
 } // namespace
 
-void MirrorFindings(const T_SKEL_CURVE& curve, const T_PLACE& place, std::vector<T_FINDING>& out)
+void MirrorFindings(const T_SKEL_CURVE& curve, const T_HINGE_PLACE& place,
+                    std::vector<T_FINDING>& out)
 {
     std::visit([&](const auto& c) { CompareCurve(c, place, out); }, curve);
 }

@@ -9,4 +9,5 @@ T_HINGE_COMPONENT MirroredComponent(T_HINGE_COMPONENT component);
 
 /// Members of the negative side of a symmetric curve that contradict the positive one. A negative
 /// side of zeros is one that was left out.
-void MirrorFindings(const T_SKEL_CURVE& curve, const T_PLACE& place, std::vector<T_FINDING>& out);
+void MirrorFindings(const T_SKEL_CURVE& curve, const T_HINGE_PLACE& place,
+                    std::vector<T_FINDING>& out);

@@ -7,7 +7,7 @@
 namespace {
 
 using B = T_BACKBONE;
-using R = T_RULE<T_BACKBONE>;
+using R = T_HINGE_RULE<T_BACKBONE>;
 
 constexpr double kStrengthTol = 1e-9; // of strength / yield strength
 constexpr const char* kMsg = kHingeRuleMessage;

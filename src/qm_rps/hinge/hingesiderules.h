@@ -18,7 +18,7 @@ struct T_BACKBONE {
     bool criteria = true;              // the acceptance criteria are in use
 };
 
-using T_BACKBONE_RULES = std::span<const T_RULE<T_BACKBONE>>;
+using T_BACKBONE_RULES = std::span<const T_HINGE_RULE<T_BACKBONE>>;
 
 /// In the order in which the curves check them.
 T_BACKBONE_RULES PositiveSignRules();

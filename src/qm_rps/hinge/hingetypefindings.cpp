@@ -39,7 +39,7 @@ bool HasLineElement(const T_PHGT_D& t)
 }
 
 // clang-format off
-const T_RULE<T> kTypeRules[] = {
+const T_HINGE_RULE<T> kTypeRules[] = {
     {{"IDS_QM_HINGE_NAME_EMPTY", kLit, nullptr, nullptr, "name"}, [](const T& t) { return !t.type.name.empty(); }},
     {{"IDS_CMD_IEHP_NO_SECT", kLit, nullptr, nullptr, "section"}, [](const T& t) { return t.Section() != nullptr; },
      [](const T& t) { return t.sources && (t.type.section != 0 || t.Calculates()); }},
@@ -80,7 +80,7 @@ void OfferFindings(const T_PHGT_D& type, const T_HINGE_CONTEXT& context, std::si
                   {static_cast<int>(i)}));
 }
 
-void CurveFindings(SKEL_TYPE type, const T_SKEL_CURVE& curve, const T_PLACE& place,
+void CurveFindings(SKEL_TYPE type, const T_SKEL_CURVE& curve, const T_HINGE_PLACE& place,
                    std::vector<T_FINDING>& out)
 {
     if (const auto* m = std::get_if<T_SKEL_MULTI>(&curve))
@@ -142,7 +142,7 @@ bool Alpha2Suits(const Q& q)
 }
 constexpr const char* kAlpha = "IDS_RPS_PO_MULTI_WARNING_ALPHA";
 // clang-format off
-const T_RULE<Q> kAlphaRules[] = {
+const T_HINGE_RULE<Q> kAlphaRules[] = {
     {{kAlpha, kLit, "alpha1 <= 1", nullptr, "sides.pos.alpha1", HINGE_SIDE::Positive, "alpha1"}, Alpha1Suits<true>},
     {{kAlpha, kLit, "alpha1 <= 1", nullptr, "sides.neg.alpha1", HINGE_SIDE::Negative, "alpha1"}, Alpha1Suits<false>, [](const Q& q) { return !q.m.symmetric; }},
     {{kAlpha, kLit, "alpha2 <= alpha1", nullptr, "sides.pos.alpha2", HINGE_SIDE::Positive, "alpha2"}, Alpha2Suits<true>, [](const Q& q) { return q.tri; }},
@@ -192,7 +192,7 @@ std::vector<T_FINDING> HingeTypeFindings(const T_PHGT_D& type, const T_HINGE_CON
 {
     const T check{type, context.sources.get()};
     std::vector<T_FINDING> out;
-    WalkRules(std::span<const T_RULE<T>>(kTypeRules), check, {}, out);
+    WalkRules(kTypeRules, check, {}, out);
     for (std::size_t i = 0; i < type.components.size(); ++i) {
         const T_HINGE_COMPONENT& c = type.components[i];
         if (!c.active) continue;
@@ -221,8 +221,7 @@ std::vector<T_FINDING> HingeTypeWarnings(const T_PHGT_D& type)
             const auto* m = std::get_if<T_SKEL_MULTI>(&curve);
             if (!m || m->useDeformation) return;
             ++curves;
-            WalkRules(std::span<const T_RULE<Q>>(kAlphaRules), Q{*m, IsTrilinear(c.type)},
-                      {static_cast<int>(i), end}, out);
+            WalkRules(kAlphaRules, Q{*m, IsTrilinear(c.type)}, {static_cast<int>(i), end}, out);
         });
     }
     if (curves < 2) out.clear(); // the warning is about several curves at once

@@ -1,7 +1,7 @@
 #include "qm_ui/form/dialogwindow.h"
 
+#include "qm_base/checkeddialog.h"
 #include "qm_base/msgfunction.h"
-#include "qm_rps/dialog/hingedialog.h"
 
 #include <QDialogButtonBox>
 #include <QEvent>
@@ -30,8 +30,8 @@ CDialogWindow::CDialogWindow(const CViewFactory& factory, const T_VIEW& view,
     m_form->m_message = [this](const char* key) {
         m_dialogView.ShowMessage(key, zql::lib::MMSGFunction::GetValue(key));
     };
-    if (auto* hinge = dynamic_cast<CHingeDialog*>(&model))
-        m_form->SetFindings([hinge] { return hinge->Findings(); });
+    if (auto* checked = dynamic_cast<CCheckedDialog*>(&model))
+        m_form->SetFindings([checked] { return checked->Findings(); });
     m_view.build(*m_form, model);
 
     m_scroll->setWidget(m_form);

@@ -5,7 +5,7 @@
 // too, and findings are marked on the fields that they name.
 #pragma once
 
-#include "qm_rps/hinge/hingefindings.h"
+#include "qm_base/finding.h"
 #include "qm_ui/form/formfields.h"
 #include "qm_ui/form/gridbinding.h"
 

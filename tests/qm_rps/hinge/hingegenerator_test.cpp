@@ -142,7 +142,7 @@ TEST(HingeGenerator, NamesTheElementsOnWhichStrengthsFail)
     EXPECT_EQ("element 2", found[0].field);
     EXPECT_EQ("IDS_CMD_IEHP_NO_SECT", found[0].ruleText);
     EXPECT_EQ("IDS_CMD_IEHP_NO_RBAR", found[2].ruleText);
-    EXPECT_EQ(4, found[3].component);
+    EXPECT_EQ(4, found[3].part);
     EXPECT_TRUE(CHingeGenerator(doc).ElementFindings(2).empty());
 }
 

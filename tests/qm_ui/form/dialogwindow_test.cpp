@@ -1,5 +1,5 @@
 // The binder with real events: a small model, typed into, refused, accepted.
-#include "qm_rps/dialog/hingedialog.h"
+#include "qm_base/checkeddialog.h"
 #include "qm_ui/form/dialogwindow.h"
 #include "qm_ui/form/gridview.h"
 #include "qm_ui/form/localnumber.h"
@@ -20,7 +20,7 @@
 namespace {
 
 /// Two numbers in order, a flag that opens the second, a table of three numbers.
-class CSpanDlg : public CHingeDialog {
+class CSpanDlg : public CCheckedDialog {
 public:
     double m_low = 1.0 / 3.0, m_high = 2.0;
     bool m_both = true;

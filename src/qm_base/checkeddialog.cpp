@@ -1,6 +1,6 @@
-#include "qm_rps/dialog/hingedialog.h"
+#include "qm_base/checkeddialog.h"
 
-int CHingeDialog::CheckData()
+int CCheckedDialog::CheckData()
 {
     const std::vector<T_FINDING> found = Findings();
     if (found.empty()) return 1;
