@@ -2,6 +2,8 @@
 // direct solver (MUMPS with a METIS ordering).
 #pragma once
 
+#include "qm_solver/sparse/symmetricmatrix.h"
+
 #include <cstddef>
 #include <memory>
 #include <span>
@@ -9,14 +11,6 @@
 #include <vector>
 
 namespace solver {
-
-/// Upper triangle with the diagonal, by rows; columns ascending in a row, indices from 0.
-struct T_SYMMETRIC_MATRIX {
-    std::vector<int> rowStart; // size n + 1
-    std::vector<int> column;
-    std::vector<double> value;
-    std::size_t Size() const { return rowStart.empty() ? 0 : rowStart.size() - 1; }
-};
 
 /// Figures of the last factorisation.
 struct T_FACTOR_INFO {

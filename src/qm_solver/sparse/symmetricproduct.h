@@ -1,7 +1,7 @@
 // Products with symmetric matrices of which the upper triangle is stored.
 #pragma once
 
-#include "qm_solver/sparse/sparsefactor.h"
+#include "qm_solver/sparse/symmetricmatrix.h"
 
 #include <span>
 
