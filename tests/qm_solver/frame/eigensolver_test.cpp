@@ -48,7 +48,7 @@ struct T_CASE {
 
 TEST(EigenSolver, AgreesWithADenseSolverOnASingularMass)
 {
-    for (const T_CASE& c : {T_CASE{60, 100}, T_CASE{60, 7}, T_CASE{900, 20}}) { // last: Lanczos
+    for (const T_CASE& c : {T_CASE{60, 100}, T_CASE{60, 7}, T_CASE{420, 20}}) { // last: Lanczos
         SCOPED_TRACE(c.n);
         const MatrixXd k = sample::RandomMatrix(c.n, 60.0, 11), m = ClusteredMass(c.n);
         const T_EIGENPAIRS pairs = Pairs(k, m, c.count);
