@@ -4,9 +4,8 @@
 #include "inputfile.h"
 #include "output.h"
 #include "qm_base/textformat.h"
-#include "qm_rps/factors/ulfiterationdochost.h"
-#include "qm_rps/factors/ulfstageresults.h"
-#include "qm_rps/ulfiterationresultdlg.h"
+#include "qm_rps/factors/ulfstageproblem.h"
+#include "qm_rps/ulfiterationdochost.h"
 #include "qm_rps/unknownloadfactoriteranal.h"
 #include "ulfrun.h"
 
@@ -34,28 +33,15 @@ struct T_INTERRUPT {
     void (*before)(int);
 };
 
-/// Wants every iteration, and the report as the options say.
-class CIterateView : public zql::frx::IDialogView {
+/// Wants every iteration, and the report as the options say; shows a line on a terminal that
+/// changes with each iteration.
+class CIteratePerson : public IUlfIterationPerson {
 public:
-    explicit CIterateView(bool overwrite) : m_overwrite(overwrite) {}
-    std::string m_message; // the latest one
-    void ShowMessage(const std::string&, const std::string& text) override { m_message = text; }
-    bool AskYesNo(const std::string&, const std::string&) override { return m_overwrite; }
-    int RunModal(zql::frx::MDialog& child) override
-    {
-        auto* dialog = dynamic_cast<CUlfIterationResultDlg*>(&child);
-        if (dialog) dialog->m_iterate = true;
-        return dialog ? child.OnOK() : 0;
-    }
-
-private:
-    bool m_overwrite;
-};
-
-/// A line on a terminal that changes with each iteration.
-class CProgressLine {
-public:
-    bool operator()(int done, int required)
+    explicit CIteratePerson(bool overwrite) : m_overwrite(overwrite) {}
+    void Solved(const T_ULF_ITER_STEP&, const std::optional<T_FINDING>&) override {}
+    ULF_ITER_WISH Wish(const T_ULF_ITER_STEP&) override { return ULF_ITER_WISH::Iterate; }
+    bool MayOverwrite(const std::string&) override { return m_overwrite; }
+    bool GoesOn(int done, int required) override
     {
         if (done != m_shown && isatty(STDERR_FILENO)) {
             std::fprintf(stderr, "\rqm-rps: %d of at most %d iterations done", done, required);
@@ -66,6 +52,7 @@ public:
     }
 
 private:
+    bool m_overwrite;
     int m_shown = -1;
 };
 
@@ -181,28 +168,25 @@ EXIT_CODE RunUlfIterate(const T_ITERATE_OPTIONS& o)
     if (!doc.Attr().FindUlsi(o.item, key))
         return Complain(EXIT_CODE::Usage,
                         o.file + ": no construction-stage item named \"" + o.item + "\"");
-    CUlfStageResults results(doc);
-    CUnknownStageItemDlg dialog(doc, results, key);
-    dialog.m_sumStageLoads = o.sumStageLoads;
-    if (const auto findings = dialog.Findings(); !findings.empty())
+    const T_ULSI_D item = doc.Data().Model().ulfStageItems.at(key);
+    if (const auto findings = CheckUlfStageItem(item, key, doc.Data()); !findings.empty())
         return Complain(EXIT_CODE::BadInput, o.file + ": " + findings.front().text);
     if (const EXIT_CODE code = AnalyseStages(doc, o.file); code != EXIT_CODE::Done) return code;
 
-    CIterateView view(o.overwrite);
-    dialog.SetView(&view);
-    CUlfIterationDocHost host(doc, dialog, &view);
+    CUlfIterationDocHost host(doc, item, o.sumStageLoads);
+    CIteratePerson person(o.overwrite);
     CUnknownLoadFactorIterAnal* settings = CUnknownLoadFactorIterAnal::Of(doc.DynModules());
     if (!settings || !settings->Set({o.iterations, o.tolerance}))
         return Complain(EXIT_CODE::Usage, "the settings of the iteration were refused");
-    CUlfIteration run(host, settings->Settings());
-    run.m_progress = CProgressLine();
+    CUlfIteration run(host, person, settings->Settings());
     const T_INTERRUPT interrupt;
-    const int done = dialog.OnIterate(run);
+    const int done = run.Run();
     if (isatty(STDERR_FILENO) && run.History().size() > 1) std::fprintf(stderr, "\n");
-    const auto& result = dialog.Result();
+    const auto& result = host.Result();
     const bool met = result && std::ranges::all_of(UlfResultRows(*result), &T_ULF_RESULT_ROW::met);
     const T_END_WORDS words = WordsOf(run, o, met);
-    const std::string reason = host.Error().empty() ? view.m_message : host.Error();
+    const std::string said = run.Said() ? run.Said()->text : std::string();
+    const std::string reason = host.Error().empty() ? said : host.Error();
     if (!done || words.code != EXIT_CODE::Done)
         Complain(words.code, o.file + ": " + words.status + (reason.empty() ? "" : ": " + reason));
     const EXIT_CODE written = WriteResults(run, o, words.status);

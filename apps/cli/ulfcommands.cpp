@@ -6,7 +6,6 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/factors/ulfstageplace.h"
-#include "qm_rps/factors/ulfstageresults.h"
 #include "qm_rps/factors/ulftexts.h"
 #include "qm_rps/unknownloadfactoritemdlg.h"
 #include "qm_rps/unknownloadfactorresultdlg.h"
@@ -173,9 +172,8 @@ EXIT_CODE RunUlfCheck(const T_ULF_OPTIONS& o)
     };
     for (const auto& [key, item] : doc.Data().Model().ulfItems)
         check(item.name, CUnknownLoadFactorItemDlg(doc, key));
-    CUlfStageResults results(doc);
     for (const auto& [key, item] : doc.Data().Model().ulfStageItems)
-        check(item.name, CUnknownStageItemDlg(doc, results, key));
+        check(item.name, CUnknownStageItemDlg(doc, key));
     if (items == 0 && !o.item.empty())
         return Complain(EXIT_CODE::Usage,
                         o.file + ": no unknown load factor item named \"" + o.item + "\"");
@@ -213,7 +211,7 @@ EXIT_CODE RunUlfExplain(const T_ULF_OPTIONS& o)
     if (const EXIT_CODE code = OpenAndAnalyse(o, in); code != EXIT_CODE::Done) return code;
     const T_ULF_OUTCOME outcome = SolveUlf(*in.dialog);
     T_ULF_EXPLAINED explained;
-    const auto& run = in.dialog->LastRun();
+    const auto& run = in.dialog->Calculation().run;
     const std::function<bool(int, int)> progress =
         isatty(STDERR_FILENO) ? ShowSearch : std::function<bool(int, int)>();
     if (!run || !ExplainUlf(*run, in.doc.Unit().Units(), explained, progress))

@@ -7,7 +7,6 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/factors/ulfchecks.h"
-#include "qm_rps/factors/ulfstageresults.h"
 #include "qm_rps/unknownloadfactoritemdlg.h"
 #include "qm_rps/unknownstageitemdlg.h"
 
@@ -85,9 +84,6 @@ int Widest(const ROWS& rows, int least, const F& text)
 
 } // namespace
 
-T_ULF_OPENED::T_ULF_OPENED() = default;
-T_ULF_OPENED::~T_ULF_OPENED() = default;
-
 EXIT_CODE OpenUlfItem(const std::string& file, const std::string& item, bool sumStageLoads,
                       T_ULF_OPENED& out)
 {
@@ -102,8 +98,7 @@ EXIT_CODE OpenUlfItem(const std::string& file, const std::string& item, bool sum
                             " names a static item and one of construction stages; give one of "
                             "them another name");
     if (out.stage) {
-        out.results = std::make_unique<CUlfStageResults>(out.doc);
-        auto dialog = std::make_unique<CUnknownStageItemDlg>(out.doc, *out.results, stageKey);
+        auto dialog = std::make_unique<CUnknownStageItemDlg>(out.doc, stageKey);
         dialog->m_sumStageLoads = sumStageLoads;
         out.dialog = std::move(dialog);
     } else if (isStatic) {
@@ -136,14 +131,14 @@ EXIT_CODE AnalyseStages(CDBDoc& doc, const std::string& file)
 T_ULF_OUTCOME SolveUlf(CUlfItemDialog& dialog)
 {
     T_ULF_OUTCOME out;
-    const bool solved = dialog.OnCalculate();
-    const auto& run = dialog.LastRun();
+    const T_ULF_CALCULATION& calculation = dialog.Calculate();
+    const auto& run = calculation.run;
     if (run) out.solverCode = run->answer.code;
     out.exact = dialog.m_solveByEquations || (run && run->answer.exact);
-    if (!dialog.Messages().empty()) out.message = OneLine(dialog.Messages().back().text);
-    if (solved) {
-        out.exact = dialog.Result()->exact;
-        const auto rows = UlfResultRows(*dialog.Result());
+    if (calculation.said) out.message = OneLine(calculation.said->text);
+    if (calculation.result) {
+        out.exact = calculation.result->exact;
+        const auto rows = UlfResultRows(*calculation.result);
         const bool met = std::ranges::all_of(rows, &T_ULF_RESULT_ROW::met);
         out.status = met ? "found" : "not met";
         out.code = met ? EXIT_CODE::Done : EXIT_CODE::NotFound;

@@ -6,7 +6,6 @@
 #include "qm_rps/ulfitemdialog.h"
 
 #include <memory>
-
 #include <string>
 
 /// What a run gave.
@@ -18,18 +17,10 @@ struct T_ULF_OUTCOME {
     bool exact = false;
 };
 
-class IUlfStageResults;
-
 /// A document with one of its items, ready to be calculated.
 struct T_ULF_OPENED {
-    T_ULF_OPENED();
-    ~T_ULF_OPENED();
-    T_ULF_OPENED(const T_ULF_OPENED&) = delete;
-    T_ULF_OPENED& operator=(const T_ULF_OPENED&) = delete;
-
     CDBDoc doc;
-    bool stage = false;                        // the item is one of construction stages
-    std::unique_ptr<IUlfStageResults> results; // of such an item
+    bool stage = false; // the item is one of construction stages
     std::unique_ptr<CUlfItemDialog> dialog;
     std::vector<int> cases; // keys of the load cases of a static item
 };

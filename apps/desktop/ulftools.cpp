@@ -76,12 +76,9 @@ bool OpenUlfRecord(T_DESKTOP& desktop, EXPLORER_TABLE table, int key)
     case EXPLORER_TABLE::UlfItems:
         Show<CUnknownLoadFactorItemDlg>(desktop, key);
         return true;
-    case EXPLORER_TABLE::UlfStageItems: {
-        CUlfStageResults results(desktop.doc);
-        CUnknownStageItemDlg dialog(desktop.doc, results, key);
-        Show(desktop, dialog);
+    case EXPLORER_TABLE::UlfStageItems:
+        Show<CUnknownStageItemDlg>(desktop, key);
         return true;
-    }
     case EXPLORER_TABLE::Combinations:
         Show<CLoadCombinationDlg>(desktop, key);
         return true;

@@ -1,24 +1,11 @@
 #include "qm_rps/ulfitemdialog.h"
 
-#include "qm_base/messagehistory.h"
-#include "qm_base/msgfunction.h"
 #include "qm_rps/factors/ulfchecks.h"
 #include "qm_rps/factors/ulfstageplace.h"
 #include "qm_rps/ulfexplanationdlg.h"
 #include "qm_rps/unknownloadfactorresultdlg.h"
 
 #include <algorithm>
-
-using zql::lib::MMSGFunction;
-
-namespace {
-
-void WriteHistory(const char* key)
-{
-    GSaveHistoryFormatNF("%s", MMSGFunction::GetValue(key).c_str());
-}
-
-} // namespace
 
 void CUlfItemDialog::SetChecks(const std::vector<std::string>& names, bool itemsFirst)
 {
@@ -46,16 +33,6 @@ std::vector<std::string> CUlfItemDialog::CheckedNames() const
     return names;
 }
 
-int CUlfItemDialog::ReadConstraints(T_ULF_RUN& run) const
-{
-    for (const std::string& name : run.item.constraints) {
-        T_ULFC_D constraint;
-        if (!m_doc.Attr().GetUlfc_(name, constraint)) return 0;
-        run.constraints.push_back(std::move(constraint));
-    }
-    return 1;
-}
-
 std::string CUlfItemDialog::CheckText(std::size_t check) const
 {
     T_ULFC_D constraint;
@@ -75,10 +52,24 @@ int CUlfItemDialog::OnAnalyse(const ULF_PROGRESS& progress, std::string& error)
     return 0;
 }
 
+const T_ULF_CALCULATION& CUlfItemDialog::Calculate()
+{
+    const std::vector<T_FINDING> found = Findings();
+    m_calculation = found.empty() ? Calculated() : T_ULF_CALCULATION{{}, {}, found.front()};
+    return m_calculation;
+}
+
+int CUlfItemDialog::OnCalculate()
+{
+    Calculate();
+    if (const auto& said = m_calculation.said) ShowMessage(said->messageKey, said->text);
+    return Result() ? 1 : 0;
+}
+
 int CUlfItemDialog::OnSolve()
 {
     if (!OnCalculate()) return 0;
-    CUnknownLoadFactorResultDlg dialog(m_doc, *m_result);
+    CUnknownLoadFactorResultDlg dialog(m_doc, *Result());
     dialog.SetView(View());
     (void)dialog.DoModal();
     return 1;
@@ -87,73 +78,22 @@ int CUlfItemDialog::OnSolve()
 int CUlfItemDialog::OnExplain(const std::function<bool(int, int)>& progress)
 {
     m_explained.reset();
-    const std::size_t before = Messages().size();
-    zql::frx::IDialogView* const view = View();
-    SetView(nullptr); // the message of a calculation without a solution is told with the rest
-    (void)OnCalculate();
-    SetView(view);
-    const bool told = Messages().size() > before;
-    m_explainedMessage = told ? Messages().back().text : std::string();
+    Calculate();
     T_ULF_EXPLAINED explained;
-    if (!m_run || !ExplainUlf(*m_run, m_doc.Unit().Units(), explained, progress)) return 0;
+    const auto& run = m_calculation.run;
+    if (!run || !ExplainUlf(*run, m_doc.Unit().Units(), explained, progress)) return 0;
     m_explained = std::move(explained);
     return 1;
 }
 
 void CUlfItemDialog::ShowExplanation()
 {
+    const std::string said = m_calculation.said ? m_calculation.said->text : std::string();
     if (!m_explained) {
-        if (!m_explainedMessage.empty())
-            ShowMessage("IDS_RPS_Unknown_Load_Factor_Item_has_an_error", m_explainedMessage);
+        if (!said.empty()) ShowMessage("IDS_RPS_Unknown_Load_Factor_Item_has_an_error", said);
         return;
     }
-    CUlfExplanationDlg dialog(m_name, m_explainedMessage, *m_explained);
+    CUlfExplanationDlg dialog(m_name, said, *m_explained);
     dialog.SetView(View());
     (void)dialog.DoModal();
-}
-
-void CUlfItemDialog::Forget()
-{
-    m_result.reset();
-    m_run.reset();
-}
-
-int CUlfItemDialog::Finish(T_ULF_RUN run, bool solved, const std::string& sourceError)
-{
-    m_run = std::move(run);
-    if (!solved) {
-        constexpr const char* key = "IDS_RPS_Unknown_Load_Factor_Item_has_an_error";
-        ShowMessage(key, MMSGFunction::Format(key, {m_name, FailureText(*m_run, sourceError)}));
-        WriteHistory("IDS_RPS_Unknown_CANNOT_FIND_OPTIMIZED_SOLUTION");
-        return 0;
-    }
-    m_result = UlfResultOf(*m_run, m_run->answer.factors);
-    WriteHistory("IDS_RPS_Unknown_CAN_FIND_OPTIMIZED_SOLUTION");
-    ReportMisses();
-    return 1;
-}
-
-/// The optimizer's message with the name of the constraint or load case that it numbers.
-std::string CUlfItemDialog::FailureText(const T_ULF_RUN& run, const std::string& sourceError)
-{
-    const T_OPT_ANSWER& a = run.answer;
-    if (a.message.empty()) return sourceError;
-    std::string name;
-    if (a.constraint > 0)
-        name = run.constraints[run.formed.owner[static_cast<std::size_t>(a.constraint - 1)]].name;
-    else if (a.factor > 0)
-        name = run.cases[run.formed.unknowns[static_cast<std::size_t>(a.factor - 1)]].name;
-    return name.empty() ? a.message : a.message + " (" + name + ")";
-}
-
-void CUlfItemDialog::ReportMisses()
-{
-    std::string names;
-    for (const T_ULF_RESULT_ROW& row : UlfResultRows(*m_result))
-        if (!row.met) names += (names.empty() ? "" : ", ") + UlfNameAt(row.name, row.place);
-    if (names.empty()) return;
-    constexpr const char* key = "IDS_QM_ULF_NOT_MET";
-    const std::string text = MMSGFunction::Format(key, {names});
-    ShowMessage(key, text);
-    GSaveHistoryFormatNF("%s", text.c_str());
 }

@@ -36,10 +36,10 @@ public:
     /// says why not.
     [[nodiscard]] int OnAnalyse(const ULF_PROGRESS& progress, std::string& error);
 
-    /// The calculation. 1: Result() has the factors; constraints that equations could not meet to
-    /// 1e-6 are named in a message. 0: refused or not solved, with a message, and no result kept.
-    /// Either outcome goes to the message history.
-    [[nodiscard]] virtual int OnCalculate() = 0;
+    /// Checks and calculates without a word to the person. A refused check is what it has said.
+    const T_ULF_CALCULATION& Calculate();
+    /// The same, then shows what it has said. 1: Result() has the factors; 0: it has none.
+    [[nodiscard]] int OnCalculate();
     /// Calculates and shows the window of the result. 1 solved.
     [[nodiscard]] int OnSolve();
     /// Calculates and explains the outcome; progress as of ExplainUlf. 1 ShowExplanation can show
@@ -47,17 +47,19 @@ public:
     [[nodiscard]] int OnExplain(const std::function<bool(int, int)>& progress);
     /// Shows the window of the latest explanation, or the message of the refused calculation.
     void ShowExplanation();
-    const std::optional<T_ULF_RESULT>& Result() const { return m_result; }
-    /// Of the latest calculation that reached the optimizer, for its explanation.
-    const std::optional<T_ULF_RUN>& LastRun() const { return m_run; }
+    /// The latest calculation, and its result.
+    const T_ULF_CALCULATION& Calculation() const { return m_calculation; }
+    const std::optional<T_ULF_RESULT>& Result() const { return m_calculation.result; }
 
 protected:
-    /// Flags of the grids: "1" and "0".
     CDBDoc& m_doc;
 
+    /// The calculation of an item that keeps its rules.
+    virtual T_ULF_CALCULATION Calculated() = 0;
     /// What to analyse for a calculation; empty: the document has current results of it all.
     virtual std::optional<T_ANALYSIS_OPTIONS> MissingResults() const = 0;
 
+    /// Flags of the grids: "1" and "0".
     static std::string Flag(bool on) { return on ? "1" : "0"; }
 
     /// The constraints of the model in its order, or those of the item before the others, with
@@ -65,22 +67,9 @@ protected:
     void SetChecks(const std::vector<std::string>& names, bool itemsFirst);
     /// Names that are checked, then those that the model lacks.
     std::vector<std::string> CheckedNames() const;
-    /// The constraints of run.item. 1 done; 0 one of them is gone.
-    [[nodiscard]] int ReadConstraints(T_ULF_RUN& run) const;
-
-    /// Forgets the latest calculation.
-    void Forget();
-    /// Keeps the run; makes the result, or shows why there is none: the optimizer's message with
-    /// the name of what it numbers, or why a response can't be had. `solved` comes back.
-    int Finish(T_ULF_RUN run, bool solved, const std::string& sourceError);
 
 private:
-    static std::string FailureText(const T_ULF_RUN& run, const std::string& sourceError);
-    void ReportMisses();
-
     std::vector<std::string> m_missing; // constraints that the item names and the model lacks
-    std::optional<T_ULF_RUN> m_run;
-    std::optional<T_ULF_RESULT> m_result;
-    std::optional<T_ULF_EXPLAINED> m_explained;
-    std::string m_explainedMessage; // of the calculation that is explained
+    T_ULF_CALCULATION m_calculation;
+    std::optional<T_ULF_EXPLAINED> m_explained; // of it
 };

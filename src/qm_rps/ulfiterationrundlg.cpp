@@ -3,7 +3,9 @@
 #include "qm_base/messagehistory.h"
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
-#include "qm_rps/factors/ulfiterationdochost.h"
+#include "qm_rps/factors/ulfanalysis.h"
+#include "qm_rps/factors/ulfstageproblem.h"
+#include "qm_rps/ulfiterationdochost.h"
 #include "qm_rps/unknownloadfactoriteranaldlg.h"
 #include "qm_rps/unknownloadfactorresultdlg.h"
 
@@ -37,6 +39,12 @@ std::string EndText(ULF_ITER_END end, const std::string& reason)
     return reason.empty() ? text : text + "\n" + reason;
 }
 
+std::string RunningText(int iterations, int required)
+{
+    return MMSGFunction::Format("IDS_QM_UI_ULF_RUNNING",
+                                {std::to_string(iterations), std::to_string(required)});
+}
+
 /// While it lives, the flag is set.
 struct T_RUNNING {
     bool& flag;
@@ -54,11 +62,6 @@ CUlfIterationRunDlg::CUlfIterationRunDlg(CDBDoc& doc, int item) : m_doc(doc), m_
     if (std::ranges::find(keys, item) == keys.end()) m_item = keys.empty() ? 0 : keys.front();
 }
 
-CUlfIterationRunDlg::CUlfIterationRunDlg(CDBDoc& doc, CUnknownStageItemDlg& item)
-    : m_doc(doc), m_given(&item)
-{
-}
-
 std::vector<int> CUlfIterationRunDlg::ItemKeys() const
 {
     std::vector<int> keys;
@@ -67,9 +70,17 @@ std::vector<int> CUlfIterationRunDlg::ItemKeys() const
     return keys;
 }
 
+T_ULF_ITER_ITEM CUlfIterationRunDlg::Item() const
+{
+    if (m_given) return *m_given;
+    const T_TABLE<T_ULSI_D>& items = m_doc.Data().Model().ulfStageItems;
+    const auto it = items.find(m_item);
+    return it == items.end() ? T_ULF_ITER_ITEM() : T_ULF_ITER_ITEM{m_item, it->second};
+}
+
 std::vector<std::string> CUlfIterationRunDlg::ItemTexts() const
 {
-    if (m_given) return {m_given->m_name};
+    if (m_given) return {m_given->record.name};
     std::vector<std::string> names;
     for (const auto& entry : m_doc.Data().Model().ulfStageItems)
         names.push_back(entry.second.name);
@@ -175,43 +186,55 @@ int CUlfIterationRunDlg::OnRun()
     return done;
 }
 
+void CUlfIterationRunDlg::Solved(const T_ULF_ITER_STEP& step, const std::optional<T_FINDING>& said)
+{
+    if (said) ShowMessage(said->messageKey, said->text);
+    m_history.push_back(step);
+    m_step = static_cast<int>(m_history.size()) - 1;
+    Tell(RunningText(step.iteration, Settings().required));
+}
+
+ULF_ITER_WISH CUlfIterationRunDlg::Wish(const T_ULF_ITER_STEP& step)
+{
+    CUlfIterationResultDlg dialog(step);
+    dialog.SetView(View());
+    if (!dialog.DoModal() || !dialog.m_iterate) return ULF_ITER_WISH::Stop;
+    return dialog.m_dontAsk ? ULF_ITER_WISH::IterateUnasked : ULF_ITER_WISH::Iterate;
+}
+
+bool CUlfIterationRunDlg::MayOverwrite(const std::string& report)
+{
+    constexpr const char* key = "IDS_QM_ULF_REPORT_EXISTS";
+    return AskYesNo(key, MMSGFunction::Format(key, {report}));
+}
+
+bool CUlfIterationRunDlg::GoesOn(int done, int required)
+{
+    std::string status = RunningText(done, required);
+    if (status != m_status) Tell(std::move(status));
+    if (View()) View()->DispatchEvents(); // a cancel that came while the factors were found
+    return !m_cancel;
+}
+
 int CUlfIterationRunDlg::Start()
 {
     // Copies and report stand beside the model.
     if (m_doc.Path().empty()) return Fail(MMSGFunction::GetValue("IDS_QM_UI_ULF_SAVE_FIRST"));
-    std::unique_ptr<CUnknownStageItemDlg> own;
-    if (!m_given) own = std::make_unique<CUnknownStageItemDlg>(m_doc, m_results, m_item);
-    CUnknownStageItemDlg& item = m_given ? *m_given : *own;
-    if (own) own->SetView(View());
-    if (const auto findings = item.Findings(); !findings.empty())
-        return Fail(findings.front().text);
+    const T_ULF_ITER_ITEM item = Item();
+    const auto findings = CheckUlfStageItem(item.record, item.key, m_doc.Data());
+    if (!findings.empty()) return Fail(findings.front().text);
     if (!Analyse()) return 0;
 
-    CUlfIterationDocHost host(m_doc, item, View());
-    CUlfIteration run(host, Settings());
-    const auto tellDone = [this](int iterations, int required) {
-        return MMSGFunction::Format("IDS_QM_UI_ULF_RUNNING",
-                                    {std::to_string(iterations), std::to_string(required)});
-    };
-    run.m_solved = [&] {
-        m_history = run.History();
-        m_result = item.Result();
-        m_step = static_cast<int>(m_history.size()) - 1;
-        Tell(tellDone(m_history.back().iteration, Settings().required));
-    };
-    run.m_progress = [&](int iterations, int required) {
-        std::string status = tellDone(iterations, required);
-        if (status != m_status) Tell(std::move(status));
-        if (View()) View()->DispatchEvents(); // a cancel that came while the factors were found
-        return !m_cancel;
-    };
-    zql::frx::IDialogView* const before = item.View();
-    item.SetView(View());
-    const int done = item.OnIterate(run);
-    item.SetView(before);
+    CUlfIterationDocHost host(m_doc, item.record, item.sumStageLoads);
+    CUlfIteration run(host, *this, Settings());
+    const int done = run.Run();
+    m_result = host.Result();
     m_report = run.ReportPath();
-    const bool plain = run.End() == ULF_ITER_END::Required && Settings().required == 0;
-    Tell(plain ? MMSGFunction::GetValue("IDS_QM_UI_ULF_SOLVED") : EndText(run.End(), host.Error()));
+    const ULF_ITER_END end = run.End();
+    if (end == ULF_ITER_END::NotSolved || end == ULF_ITER_END::ReportNotWritten)
+        ShowMessage(run.Said()->messageKey, run.Said()->text);
+    const bool plain = end == ULF_ITER_END::Required && Settings().required == 0;
+    Tell(plain ? MMSGFunction::GetValue("IDS_QM_UI_ULF_SOLVED") : EndText(end, host.Error()));
     return done;
 }
 

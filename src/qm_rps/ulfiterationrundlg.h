@@ -3,14 +3,18 @@
 #pragma once
 
 #include "qm_db/dbdoc.h"
-#include "qm_rps/factors/ulfstageresults.h"
+#include "qm_rps/factors/ulfresult.h"
 #include "qm_rps/ulfiterationresultdlg.h"
 #include "qm_rps/unknownloadfactoriteranal.h"
-#include "qm_rps/unknownstageitemdlg.h"
 
-#include <memory>
+/// An item of construction stages as it is to be iterated.
+struct T_ULF_ITER_ITEM {
+    int key = 0; // in the model; 0: it is not stored
+    T_ULSI_D record;
+    bool sumStageLoads = false;
+};
 
-class CUlfIterationRunDlg : public zql::frx::MDialog {
+class CUlfIterationRunDlg : public zql::frx::MDialog, private IUlfIterationPerson {
 public:
     /// Columns of the table of iterations, and of the unknowns of the chosen one: those of the
     /// result dialog, and by what the pretension had been multiplied before it.
@@ -22,8 +26,8 @@ public:
 
     /// On the stored items of the model, of which one is chosen (0: the first).
     explicit CUlfIterationRunDlg(CDBDoc& doc, int item = 0);
-    /// On an item as it is edited in its dialog, which must outlive this one.
-    CUlfIterationRunDlg(CDBDoc& doc, CUnknownStageItemDlg& item);
+    /// On an item as it is edited.
+    CUlfIterationRunDlg(CDBDoc& doc, T_ULF_ITER_ITEM item) : m_doc(doc), m_given(std::move(item)) {}
 
     /// Names of the items that can be chosen; only the edited one, where it is given.
     std::vector<std::string> ItemTexts() const;
@@ -57,7 +61,13 @@ public:
     std::string ReportPath() const { return m_report; }
 
 private:
+    void Solved(const T_ULF_ITER_STEP& step, const std::optional<T_FINDING>& said) override;
+    ULF_ITER_WISH Wish(const T_ULF_ITER_STEP& step) override;
+    bool MayOverwrite(const std::string& report) override;
+    bool GoesOn(int done, int required) override;
+
     std::vector<int> ItemKeys() const;
+    T_ULF_ITER_ITEM Item() const;
     void Clear();
     [[nodiscard]] int Start();
     [[nodiscard]] int Analyse();
@@ -65,8 +75,7 @@ private:
     int Fail(const std::string& text);
 
     CDBDoc& m_doc;
-    CUlfStageResults m_results{m_doc};
-    CUnknownStageItemDlg* m_given = nullptr;
+    std::optional<T_ULF_ITER_ITEM> m_given;
     int m_item = 0; // key
     bool m_running = false, m_cancel = false;
     std::vector<T_ULF_ITER_STEP> m_history;

@@ -31,7 +31,7 @@ std::unique_ptr<CUlfItemDialog> CUnknownLoadFactorDlg::ChosenItem()
     if (!CheckData()) return nullptr;
     std::unique_ptr<CUlfItemDialog> item;
     if (m_stage)
-        item = std::make_unique<CUnknownStageItemDlg>(m_doc, m_results, m_selected);
+        item = std::make_unique<CUnknownStageItemDlg>(m_doc, m_selected);
     else
         item = std::make_unique<CUnknownLoadFactorItemDlg>(m_doc, m_selected);
     item->SetView(View());
@@ -63,13 +63,13 @@ int CUnknownLoadFactorDlg::OnAddStage()
         ShowMessage("IDS_QM_ULSI_NO_STAGES");
         return 0;
     }
-    return Show(CUnknownStageItemDlg(m_doc, m_results), true);
+    return Show(CUnknownStageItemDlg(m_doc), true);
 }
 
 int CUnknownLoadFactorDlg::OnModify()
 {
     if (!CheckData()) return 0;
-    return m_stage ? Show(CUnknownStageItemDlg(m_doc, m_results, m_selected), true)
+    return m_stage ? Show(CUnknownStageItemDlg(m_doc, m_selected), true)
                    : Show(CUnknownLoadFactorItemDlg(m_doc, m_selected), false);
 }
 

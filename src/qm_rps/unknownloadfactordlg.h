@@ -4,7 +4,6 @@
 
 #include "qm_base/mdialog.h"
 #include "qm_db/dbdoc.h"
-#include "qm_rps/factors/ulfstageresults.h"
 #include "qm_rps/ulfitemdialog.h"
 
 #include <memory>
@@ -19,7 +18,7 @@ public:
         bool operator==(const T_ROW&) const = default;
     };
 
-    explicit CUnknownLoadFactorDlg(CDBDoc& doc) : m_doc(doc), m_results(doc) {}
+    explicit CUnknownLoadFactorDlg(CDBDoc& doc) : m_doc(doc) {}
 
     /// Static items in the order of definition, then those of stages.
     std::vector<T_ROW> Rows() const;
@@ -47,5 +46,4 @@ private:
     [[nodiscard]] int Delete(const T_TABLE<T>& table);
 
     CDBDoc& m_doc;
-    CUlfStageResults m_results;
 };

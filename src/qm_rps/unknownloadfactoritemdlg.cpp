@@ -2,7 +2,7 @@
 
 #include "qm_base/textformat.h"
 #include "qm_rps/factors/ulfchecks.h"
-#include "qm_rps/optdsgn.h"
+#include "qm_rps/ulfcalculation.h"
 
 #include <algorithm>
 
@@ -167,27 +167,9 @@ void CUnknownLoadFactorItemDlg::OnSelChangeCombinationIndex(int index)
         OnSelChangeCombination(keys[static_cast<std::size_t>(index)]);
 }
 
-int CUnknownLoadFactorItemDlg::ReadRun(T_ULF_RUN& run) const
+T_ULF_CALCULATION CUnknownLoadFactorItemDlg::Calculated()
 {
-    run.item = Record();
-    run.cases = m_cases;
-    if (!ReadConstraints(run)) return 0;
-    run.formed = FormUlfProblem(run.item, run.cases, run.constraints);
-    return 1;
-}
-
-int CUnknownLoadFactorItemDlg::OnCalculate()
-{
-    Forget();
-    T_ULF_RUN run;
-    if (!CheckData() || !ReadRun(run)) return 0;
-
-    COptDsgn optimizer(m_cache);
-    optimizer.m_dump = {m_dump, m_doc.Path(),
-                        [this] { return AskYesNo("IDS_QM_ULF_DUMP_EXISTS"); }};
-    // The matrix of all cases comes from the cache, also when there is no solution to explain.
-    const bool found = optimizer.Run(run.formed.problem, run.answer) != 0;
-    const bool solved =
-        ReadUlfInfluence(run.cases, run.constraints, m_cache, run.influence) && found;
-    return Finish(std::move(run), solved, m_cache.Error());
+    return CalculateUlf(
+        m_doc, Record(), m_cases, m_cache,
+        {m_dump, m_doc.Path(), [this] { return AskYesNo("IDS_QM_ULF_DUMP_EXISTS"); }});
 }

@@ -45,14 +45,12 @@ public:
     int OnOK() override;
     int Key() const { return m_key; }
 
-    [[nodiscard]] int OnCalculate() override;
-
     bool m_dump = false; // debug: write the problem handed to the solver beside the model file
 
 private:
+    T_ULF_CALCULATION Calculated() override;
     std::optional<T_ANALYSIS_OPTIONS> MissingResults() const override;
     std::optional<T_LCOM_D> Normalised(int combination) const;
-    int ReadRun(T_ULF_RUN& run) const;
 
     int m_key = 0;
     int m_combination = 0;

@@ -3,7 +3,8 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/factors/ulfstageplace.h"
-#include "qm_rps/optdsgn.h"
+#include "qm_rps/factors/ulfstageresults.h"
+#include "qm_rps/ulfcalculation.h"
 #include "qm_rps/ulfiterationrundlg.h"
 
 #include <algorithm>
@@ -21,8 +22,7 @@ std::string CaseName(const T_MODEL& model, int key)
 
 } // namespace
 
-CUnknownStageItemDlg::CUnknownStageItemDlg(CDBDoc& doc, IUlfStageResults& results, int key)
-    : CUlfItemDialog(doc), m_key(key), m_source(results)
+CUnknownStageItemDlg::CUnknownStageItemDlg(CDBDoc& doc, int key) : CUlfItemDialog(doc), m_key(key)
 {
     const auto& table = m_doc.Data().Model().ulfStageItems;
     const auto it = table.find(key);
@@ -198,61 +198,18 @@ std::optional<T_ANALYSIS_OPTIONS> CUnknownStageItemDlg::MissingResults() const
     return m_doc.Post().CheckStagedResult() ? std::nullopt : std::optional(options);
 }
 
-int CUnknownStageItemDlg::ReadRun(T_ULF_RUN& run, T_ULSI_D& item)
+T_ULF_CALCULATION CUnknownStageItemDlg::Calculated()
 {
-    item = Record();
-    run.item.name = item.name;
-    run.item.objective = item.objective;
-    run.item.sign = item.sign;
-    run.item.solveByEquations = item.solveByEquations;
-    run.item.constraints = item.constraints;
-    for (const T_ULSI_ROW& row : item.rows)
-        run.cases.push_back({row.loadCase, UlfStageRowText(m_doc.Data(), row), row.factor,
-                             row.unknown, row.weight});
-    if (!ReadConstraints(run)) return 0;
-    for (const T_ULFC_D& c : run.constraints)
-        run.places.push_back(c.stage ? UlfPlaceText(m_doc.Data(), c.stage, c.step) : std::string());
-    return 1;
-}
-
-int CUnknownStageItemDlg::OnCalculate()
-{
-    Forget();
-    T_ULF_RUN run;
-    T_ULSI_D item;
-    if (!CheckData() || !ReadRun(run, item)) return 0;
-    T_ULF_STAGE_FORMED formed = FormUlfStageProblem(item, run.constraints);
-    m_source.m_loads = formed.loads;
-    m_source.m_sumStageLoads = m_sumStageLoads;
-    run.formed = std::move(formed);
-    COptDsgn optimizer(m_source, &m_source);
-    const bool found = optimizer.Run(run.formed.problem, run.answer) != 0;
-    const bool solved = ReadUlfStageInfluence(item, run.formed, m_source, run.influence) && found;
-    return Finish(std::move(run), solved, m_source.Error());
-}
-
-std::vector<T_ULF_ITER_ROW> CUnknownStageItemDlg::SolvedRows() const
-{
-    std::vector<T_ULF_ITER_ROW> rows;
-    for (std::size_t i = 0; Result() && i < LastRun()->formed.unknowns.size(); ++i) {
-        const std::size_t row = RowOfUnknown(i);
-        rows.push_back({CellText(row, Stage), LastRun()->answer.factors[i], m_rows[row].pretension,
-                        CellText(row, LoadCase)});
-    }
-    return rows;
-}
-
-int CUnknownStageItemDlg::OnIterate(CUlfIteration& iteration)
-{
-    if (!CheckData()) return 0;
-    iteration.SetView(View());
-    return iteration.Run();
+    CUlfStageResults results(m_doc);
+    CUlfStageResponse source(results);
+    source.m_sumStageLoads = m_sumStageLoads;
+    return CalculateUlfStages(m_doc, Record(), source);
 }
 
 void CUnknownStageItemDlg::OnIterateWindow()
 {
     if (!CheckData()) return;
-    CUlfIterationRunDlg run(m_doc, *this);
+    CUlfIterationRunDlg run(m_doc, {m_key, Record(), m_sumStageLoads});
     run.SetView(View());
     (void)run.DoModal();
 }

@@ -2,7 +2,6 @@
 // and step, objective, sign and constraints, and the calculation of its factors.
 #pragma once
 
-#include "qm_rps/factors/ulfiteration.h"
 #include "qm_rps/factors/ulfstageproblem.h"
 #include "qm_rps/ulfitemdialog.h"
 
@@ -24,8 +23,8 @@ public:
         bool operator==(const T_SUMMARY&) const = default;
     };
 
-    /// Document and results must outlive the dialog. key: of the item to edit, 0 for a new one.
-    CUnknownStageItemDlg(CDBDoc& doc, IUlfStageResults& results, int key = 0);
+    /// The document must outlive the dialog. key: of the item to edit, 0 for a new one.
+    explicit CUnknownStageItemDlg(CDBDoc& doc, int key = 0);
 
     void Data2Dlg(const T_ULSI_D& item);
     /// The item as edited, unchecked.
@@ -60,28 +59,15 @@ public:
     int OnOK() override;
     int Key() const { return m_key; }
 
-    /// With the stage results at hand. The cases of the result are the rows, "S1/First Step T".
-    [[nodiscard]] int OnCalculate() override;
-    /// The unknowns with their factors of the latest solution, in the order of the problem.
-    std::vector<T_ULF_ITER_ROW> SolvedRows() const;
-    /// Grid row of an unknown of the problem; a calculation must have reached the optimizer.
-    std::size_t RowOfUnknown(std::size_t unknown) const
-    {
-        return LastRun().value().formed.unknowns[unknown];
-    }
-
-    /// The calculation button: checks the input, then runs the iteration on the host. 1 see
-    /// CUlfIteration::Run; 0 refused with a message, or as there.
-    [[nodiscard]] int OnIterate(CUlfIteration& iteration);
     /// Opens the window of the iterative analysis on the item as it is edited, once the input
     /// passes its check.
     void OnIterateWindow();
 
 private:
     [[nodiscard]] int SetChoice(T_ULSI_ROW& row, COLUMN column, const std::string& text) const;
+    /// With the stage results at hand.
+    T_ULF_CALCULATION Calculated() override;
     std::optional<T_ANALYSIS_OPTIONS> MissingResults() const override;
-    [[nodiscard]] int ReadRun(T_ULF_RUN& run, T_ULSI_D& item);
 
     int m_key = 0;
-    CUlfStageResponse m_source;
 };

@@ -1,6 +1,5 @@
 #include "qm_base/messagehistory.h"
 #include "qm_rps/factors/ulfexplain.h"
-#include "qm_rps/factors/ulfstageresults.h"
 #include "qm_rps/unknownloadfactorconstraintdlg.h"
 #include "qm_rps/unknownloadfactordlg.h"
 #include "qm_rps/unknownloadfactorresultdlg.h"
@@ -22,10 +21,9 @@ protected:
         options.allCases = false;
         T_ANALYSIS_ERROR fault;
         ASSERT_EQ(1, m_doc.RunAnalysis(options, fault)) << fault.text;
-        m_dialog.emplace(m_doc, m_results, 1);
+        m_dialog.emplace(m_doc, 1);
     }
     CDBDoc m_doc;
-    CUlfStageResults m_results{m_doc};
     std::optional<CUnknownStageItemDlg> m_dialog;
 };
 
@@ -134,7 +132,7 @@ TEST_F(StageItem, ExplainsAContradictionAndASignByItsRow)
     Open(std::move(content));
     EXPECT_EQ(0, m_dialog->OnCalculate());
     T_ULF_EXPLAINED e;
-    ASSERT_EQ(1, ExplainUlf(*m_dialog->LastRun(), m_doc.Unit().Units(), e));
+    ASSERT_EQ(1, ExplainUlf(*m_dialog->Calculation().run, m_doc.Unit().Units(), e));
     EXPECT_EQ(2U, e.conflict.size());
     ASSERT_TRUE(e.compromise);
     // Both are missed by 0.05 at u = 0.05, where T = 3.

@@ -129,7 +129,7 @@ TEST_F(UnknownLoadFactor, MinimisesWithinBoundsAndListsATwoBoundConstraintOnce)
     ASSERT_EQ(1, dlg.OnCalculate());
     const T_ULF_RESULT& r = *dlg.Result();
     EXPECT_FALSE(r.exact);
-    EXPECT_EQ(2u, dlg.LastRun()->formed.problem.constraints.size());
+    EXPECT_EQ(2u, dlg.Calculation().run->formed.problem.constraints.size());
     EXPECT_NEAR(6.75 / 2.4, r.factors[1], 1e-10);
     EXPECT_EQ(0.0, r.factors[2]); // a known case without effect keeps its 0 and its influence
     ASSERT_EQ(1u, r.influence.size());

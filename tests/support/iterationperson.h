@@ -1,7 +1,7 @@
 // The person of the tests of the iterative analysis.
 #pragma once
 
-#include "qm_rps/ulfiterationresultdlg.h"
+#include "qm_rps/factors/ulfiteration.h"
 
 #include <functional>
 #include <gtest/gtest.h>
@@ -9,39 +9,34 @@
 #include <thread>
 #include <vector>
 
-/// Accepts result dialogs as often as wanted and answers the question about the report.
-class CPerson : public zql::frx::IDialogView {
+/// Wants iterations as often as said and answers the question about the report.
+class CPerson : public IUlfIterationPerson {
 public:
-    int m_accept = 99; // dialogs in which iteration is chosen
-    int m_dialogs = 0; // that were shown
-    bool m_dontAsk = false;
+    int m_accept = 99;      // questions to which iteration is the answer
+    int m_questions = 0;    // that were asked
+    bool m_unasked = false; // the answer is meant for the rest of the run
     bool m_overwrite = false;
-    std::vector<std::string> m_asked;
-    int m_events = 0;
-    void ShowMessage(const std::string& key, const std::string&) override
+    std::vector<std::string> m_reports;                   // that were asked about
+    std::function<bool(int done, int required)> m_goesOn; // empty: yes
+
+    void Solved(const T_ULF_ITER_STEP&, const std::optional<T_FINDING>&) override {}
+    ULF_ITER_WISH Wish(const T_ULF_ITER_STEP&) override
     {
-        m_asked.push_back(key);
+        ++m_questions;
+        if (m_accept-- <= 0) return ULF_ITER_WISH::Stop;
+        return m_unasked ? ULF_ITER_WISH::IterateUnasked : ULF_ITER_WISH::Iterate;
     }
-    bool AskYesNo(const std::string&, const std::string& text) override
+    bool MayOverwrite(const std::string& report) override
     {
-        m_asked.push_back(text);
+        m_reports.push_back(report);
         return m_overwrite;
     }
-    int RunModal(zql::frx::MDialog& child) override
+    bool GoesOn(int done, int required) override
     {
-        auto* dialog = dynamic_cast<CUlfIterationResultDlg*>(&child);
-        if (!dialog) return 0;
-        dialog->m_iterate = m_accept-- > 0;
-        dialog->m_dontAsk = m_dontAsk;
-        ++m_dialogs;
-        return 1;
-    }
-    void DispatchEvents() override
-    {
-        ++m_events;
         EXPECT_EQ(m_thread, std::this_thread::get_id());
-        if (m_onEvents) m_onEvents();
+        return !m_goesOn || m_goesOn(done, required);
     }
-    std::function<void()> m_onEvents;
+
+private:
     std::thread::id m_thread = std::this_thread::get_id();
 };

@@ -4,12 +4,14 @@
 
 #include "qm_rps/loadcombinationdlg.h"
 #include "qm_rps/ulfexplanationdlg.h"
+#include "qm_rps/ulfiterationdochost.h"
 #include "qm_rps/ulfiterationrundlg.h"
 #include "qm_rps/unknownloadfactorconstraintdlg.h"
 #include "qm_rps/unknownloadfactordlg.h"
 #include "qm_rps/unknownloadfactoritemdlg.h"
 #include "qm_rps/unknownloadfactoriteranaldlg.h"
 #include "qm_rps/unknownloadfactorresultdlg.h"
+#include "qm_rps/unknownstageitemdlg.h"
 #include "qm_rps/unknowntabletabgrid1.h"
 #include "qm_ui/form/dialogwindow.h"
 
@@ -31,13 +33,6 @@ WINDOW WindowOf(CMainWindow& main, std::unique_ptr<MODEL> model)
     (void)KeepWith(*window, std::move(model));
     return window;
 }
-
-/// A stage item with the source of its results.
-struct T_STAGE_ITEM {
-    T_STAGE_ITEM(CDBDoc& doc, int key) : results(doc), dialog(doc, results, key) {}
-    CUlfStageResults results;
-    CUnknownStageItemDlg dialog;
-};
 
 template <class MODEL, class... ARGS>
 auto WindowMaker(ARGS... args)
@@ -63,23 +58,11 @@ WINDOW ExplanationWindow(CMainWindow& main, int item)
     std::string error;
     T_ULF_EXPLAINED explained;
     if (!dialog.OnAnalyse({}, error)) return nullptr;
-    (void)dialog.OnCalculate(); // without a solution there is the more to explain
-    const auto& messages = dialog.Messages();
-    if (!dialog.LastRun() || !ExplainUlf(*dialog.LastRun(), main.Doc().Unit().Units(), explained))
-        return nullptr;
+    // Without a solution there is the more to explain.
+    const T_ULF_CALCULATION& c = dialog.Calculate();
+    if (!c.run || !ExplainUlf(*c.run, main.Doc().Unit().Units(), explained)) return nullptr;
     return WindowOf(main, std::make_unique<CUlfExplanationDlg>(
-                              dialog.m_name, messages.empty() ? "" : messages.back().text,
-                              std::move(explained)));
-}
-
-WINDOW StageItemWindow(CMainWindow& main)
-{
-    auto item = std::make_unique<T_STAGE_ITEM>(main.Doc(), 1);
-    const T_VIEW* view = main.Desktop().factory.Find(item->dialog);
-    auto window =
-        std::make_unique<CDialogWindow>(main.Desktop().factory, *view, item->dialog, nullptr);
-    (void)KeepWith(*window, std::move(item));
-    return window;
+                              dialog.m_name, c.said ? c.said->text : "", std::move(explained)));
 }
 
 WINDOW SettingsWindow(CMainWindow& main)
@@ -119,10 +102,11 @@ WINDOW RunWindow(CMainWindow& main)
 WINDOW StepWindow(CMainWindow& main)
 {
     T_ULF_ITER_STEP step{0, main.Doc().Path(), {}, 0.0};
-    auto item = T_STAGE_ITEM(main.Doc(), 1);
+    CUnknownStageItemDlg item(main.Doc(), 1);
+    CUlfIterationDocHost host(main.Doc(), item.Record(), false);
     std::string error;
-    if (!item.dialog.OnAnalyse({}, error) || !item.dialog.OnCalculate()) return nullptr;
-    step.rows = item.dialog.SolvedRows();
+    std::optional<T_FINDING> said;
+    if (!item.OnAnalyse({}, error) || !host.Solve(step.rows, said)) return nullptr;
     step.tolerance = UlfIterTolerance(step.rows);
     return WindowOf(main, std::make_unique<CUlfIterationResultDlg>(std::move(step)));
 }
@@ -150,7 +134,7 @@ std::vector<T_WINDOW_EXAMPLE> UlfWindowExamples()
              }},
             {"ulf-result-beam", kBeam, result(1)},
             {"ulf-explanation", kBeam, [](CMainWindow& m) { return ExplanationWindow(m, 4); }},
-            {"ulf-stage-item", "cable-stayed-bridge-staged", StageItemWindow},
+            {"ulf-stage-item", "cable-stayed-bridge-staged", WindowMaker<CUnknownStageItemDlg>(1)},
             {"ulf-iteration-settings", kHangers, SettingsWindow},
             {"ulf-iteration-step", kHangers, StepWindow},
             {"ulf-iteration", kHangers, RunWindow},

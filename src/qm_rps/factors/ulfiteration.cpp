@@ -3,7 +3,6 @@
 #include "qm_base/logfile.h"
 #include "qm_base/msgfunction.h"
 #include "qm_db/filectrl.h"
-#include "qm_rps/ulfiterationresultdlg.h"
 
 #include <filesystem>
 
@@ -18,11 +17,22 @@ int CUlfIteration::Stop(ULF_ITER_END end)
 int CUlfIteration::Solve(int iteration)
 {
     T_ULF_ITER_STEP step{iteration, m_host.ModelPath(), {}, 0.0};
-    if (!m_host.Solve(step.rows)) return Stop(ULF_ITER_END::NotSolved);
+    std::optional<T_FINDING> said;
+    const bool solved = m_host.Solve(step.rows, said) != 0;
+    if (said) m_said = said;
+    if (!solved) return Stop(ULF_ITER_END::NotSolved);
     step.tolerance = UlfIterTolerance(step.rows);
     m_history.push_back(std::move(step));
-    if (m_solved) m_solved();
+    m_person.Solved(m_history.back(), said);
     return 1;
+}
+
+int CUlfIteration::RefuseReport()
+{
+    m_said.emplace();
+    m_said->messageKey = "IDS_QM_ULF_REPORT_NOT_WRITTEN";
+    m_said->text = MMSGFunction::Format(m_said->messageKey, {m_report});
+    return Stop(ULF_ITER_END::ReportNotWritten);
 }
 
 /// Head and block 0: over an existing report, or after it.
@@ -31,25 +41,19 @@ int CUlfIteration::WriteFirst()
     const std::string text =
         UlfIterHead(m_settings.required, m_settings.tolerance) + UlfIterBlock(m_history.front());
     std::error_code ignored;
-    const bool add = std::filesystem::exists(m_report, ignored) &&
-                     !AskYesNo("IDS_QM_ULF_REPORT_EXISTS",
-                               MMSGFunction::Format("IDS_QM_ULF_REPORT_EXISTS", {m_report}));
+    const bool add = std::filesystem::exists(m_report, ignored) && !m_person.MayOverwrite(m_report);
     T_FILE_ERROR error;
-    if (add ? CLogFile(m_report).Write(text) : CFileCtrl::WriteWholeFile(m_report, text, error))
-        return 1;
-    constexpr const char* key = "IDS_QM_ULF_REPORT_NOT_WRITTEN";
-    ShowMessage(key, MMSGFunction::Format(key, {m_report}));
-    return Stop(ULF_ITER_END::ReportNotWritten);
+    const int written =
+        add ? CLogFile(m_report).Write(text) : CFileCtrl::WriteWholeFile(m_report, text, error);
+    return written ? 1 : RefuseReport();
 }
 
 int CUlfIteration::AskForMore()
 {
     if (!m_asks) return 1;
-    CUlfIterationResultDlg dialog(m_history.back());
-    dialog.SetView(View());
-    const bool accepted = View() && View()->RunModal(dialog) != 0;
-    if (!accepted || !dialog.m_iterate) return Stop(ULF_ITER_END::Declined);
-    m_asks = !dialog.m_dontAsk;
+    const ULF_ITER_WISH wish = m_person.Wish(m_history.back());
+    if (wish == ULF_ITER_WISH::Stop) return Stop(ULF_ITER_END::Declined);
+    m_asks = wish == ULF_ITER_WISH::Iterate;
     return 1;
 }
 
@@ -71,10 +75,10 @@ int CUlfIteration::Analyse(int iteration)
     bool cancelled = false;
     const bool started = m_host.StartAnalysis() != 0;
     while (started && m_host.IsExcuted()) {
-        m_host.DispatchEvents();
-        if (cancelled || !m_progress || m_progress(iteration - 1, m_settings.required)) continue;
-        cancelled = true;
-        m_host.CancelAnalysis();
+        const bool goesOn = m_person.GoesOn(iteration - 1, m_settings.required);
+        if (!goesOn && !cancelled) m_host.CancelAnalysis();
+        cancelled |= !goesOn;
+        m_host.Wait();
     }
     if (started && m_host.IsPostMode()) return 1; // a request that came too late is heard again
     m_host.UndoEdit();
@@ -87,11 +91,7 @@ int CUlfIteration::Iterate(int iteration)
 {
     if (!m_host.SaveCopy(UlfIterCopyPath(m_model, iteration))) return Stop(ULF_ITER_END::NotSaved);
     if (!Scale() || !Analyse(iteration) || !Solve(iteration)) return 0;
-    if (!CLogFile(m_report).Write(UlfIterBlock(m_history.back()))) {
-        constexpr const char* key = "IDS_QM_ULF_REPORT_NOT_WRITTEN";
-        ShowMessage(key, MMSGFunction::Format(key, {m_report}));
-        return Stop(ULF_ITER_END::ReportNotWritten);
-    }
+    if (!CLogFile(m_report).Write(UlfIterBlock(m_history.back()))) return RefuseReport();
     if (m_settings.tolerance >= m_history.back().tolerance) return Stop(ULF_ITER_END::Converged);
     return AskForMore();
 }
@@ -99,10 +99,11 @@ int CUlfIteration::Iterate(int iteration)
 int CUlfIteration::Run()
 {
     m_history.clear();
+    m_said.reset();
     m_asks = true;
     m_model = m_host.ModelPath();
     m_report = UlfIterReportPath(m_model);
-    // The dialog comes before the report: who declines here leaves no report.
+    // The question comes before the report: who declines here leaves no report.
     if (!Solve(0)) return 0;
     if (!AskForMore()) return 1;
     if (!WriteFirst()) return 0;
@@ -111,8 +112,7 @@ int CUlfIteration::Run()
             m_end = ULF_ITER_END::Required;
             return 1;
         }
-        if (m_progress && !m_progress(done, m_settings.required))
-            return Stop(ULF_ITER_END::Cancelled);
+        if (!m_person.GoesOn(done, m_settings.required)) return Stop(ULF_ITER_END::Cancelled);
         if (!Iterate(done + 1))
             return m_end == ULF_ITER_END::Converged || m_end == ULF_ITER_END::Declined;
     }

@@ -2,10 +2,7 @@
 // again, until the factors are close to 1.
 #pragma once
 
-#include "qm_base/mdialog.h"
 #include "qm_rps/factors/ulfiterationhost.h"
-
-#include <functional>
 
 enum class ULF_ITER_END {
     Converged,
@@ -25,24 +22,15 @@ struct T_ULF_ITER_SETTINGS {
     bool operator==(const T_ULF_ITER_SETTINGS&) const = default;
 };
 
-/// The run. The result dialog (CUlfIterationResultDlg) and the question about an existing report
-/// go through the view; without a view nothing is accepted, so only the first solution is made.
 /// State: one run at a time. What was saved and reported before a failure stays.
-class CUlfIteration : public zql::frx::MDialog {
+class CUlfIteration {
 public:
-    /// `host` is not owned and must outlive this object.
-    CUlfIteration(IUlfIterationHost& host, T_ULF_ITER_SETTINGS settings)
-        : m_host(host), m_settings(settings)
+    /// Host and person are not owned and must outlive this object.
+    CUlfIteration(IUlfIterationHost& host, IUlfIterationPerson& person,
+                  T_ULF_ITER_SETTINGS settings)
+        : m_host(host), m_person(person), m_settings(settings)
     {
     }
-
-    /// Told before each iteration, and again and again while its analysis runs, with the number of
-    /// those done; false cancels the run, the model and its file being as after the last complete
-    /// iteration. Empty: goes on.
-    std::function<bool(int done, int required)> m_progress;
-
-    /// Told after each solution. Empty: nobody.
-    std::function<void()> m_solved;
 
     /// 1: converged, or the required number is done, or the person wanted no more; 0: cancelled or
     /// failed. End() says which.
@@ -52,11 +40,14 @@ public:
     /// Every solution so far, the first one first.
     const std::vector<T_ULF_ITER_STEP>& History() const { return m_history; }
     std::string ReportPath() const { return m_report; }
+    /// What a solution has said last, or why the report could not be written.
+    const std::optional<T_FINDING>& Said() const { return m_said; }
 
 private:
     int Stop(ULF_ITER_END end);
     [[nodiscard]] int Solve(int iteration);
     [[nodiscard]] int WriteFirst();
+    int RefuseReport();
     [[nodiscard]] int AskForMore();
     [[nodiscard]] int Scale();
     [[nodiscard]] int Analyse(int iteration);
@@ -64,9 +55,11 @@ private:
     [[nodiscard]] int Iterate(int iteration);
 
     IUlfIterationHost& m_host;
+    IUlfIterationPerson& m_person;
     T_ULF_ITER_SETTINGS m_settings;
     std::vector<T_ULF_ITER_STEP> m_history;
-    bool m_asks = true;  // the result dialog comes before each iteration
+    std::optional<T_FINDING> m_said;
+    bool m_asks = true;  // the person is asked before each iteration
     std::string m_model; // path at the start: copies are numbered from it
     std::string m_report;
     ULF_ITER_END m_end = ULF_ITER_END::Declined;

@@ -1,9 +1,12 @@
-// What the iterative analysis for pretension asks of the program around it.
+// What the iterative analysis for pretension asks of the program and of the person around it.
 #pragma once
 
 #include "qm_rps/factors/ulfiterationreport.h"
+#include "qm_rps/hinge/hingefindings.h"
 
-/// One model and its construction-stage problem. A refused operation (0) has told the person why.
+#include <optional>
+
+/// One model and its construction-stage problem.
 class IUlfIterationHost {
 public:
     IUlfIterationHost() = default;
@@ -13,7 +16,9 @@ public:
 
     virtual std::string ModelPath() const = 0;
     /// Finds the factors of the unknowns with the results at hand, in the order of the problem.
-    [[nodiscard]] virtual int Solve(std::vector<T_ULF_ITER_ROW>& rows) = 0;
+    /// said: why there are none, or which constraints they miss; empty: nothing.
+    [[nodiscard]] virtual int Solve(std::vector<T_ULF_ITER_ROW>& rows,
+                                    std::optional<T_FINDING>& said) = 0;
     /// Saves the model under another name, which becomes its own.
     [[nodiscard]] virtual int SaveCopy(const std::string& path) = 0;
 
@@ -26,13 +31,39 @@ public:
     /// Takes the latest closed edit back, and what an analysis has found since.
     virtual void UndoEdit() = 0;
 
-    /// Starts the analysis; IsExcuted while it runs, DispatchEvents keeps the window alive (all
-    /// but closing it and system commands). The model is in post mode once results of it as it is
-    /// are there. The host keeps results with the model's file.
+    /// Starts the analysis; IsExcuted while it runs, Wait gives it a little time. The model is in
+    /// post mode once results of it as it is are there. The host keeps results with the model's
+    /// file.
     [[nodiscard]] virtual int StartAnalysis() = 0;
     virtual bool IsExcuted() = 0;
     /// Asks the analysis that is running to end without results; it may have ended already.
     virtual void CancelAnalysis() = 0;
-    virtual void DispatchEvents() = 0;
+    virtual void Wait() = 0;
     virtual bool IsPostMode() = 0;
+};
+
+/// What a person wants after a solution.
+enum class ULF_ITER_WISH {
+    Stop,
+    Iterate,
+    IterateUnasked, // and not be asked again in this run
+};
+
+/// Who the run is made for.
+class IUlfIterationPerson {
+public:
+    IUlfIterationPerson() = default;
+    IUlfIterationPerson(const IUlfIterationPerson&) = delete;
+    IUlfIterationPerson& operator=(const IUlfIterationPerson&) = delete;
+    virtual ~IUlfIterationPerson() = default;
+
+    /// Each solution, with what there is to say about it, before Wish.
+    virtual void Solved(const T_ULF_ITER_STEP& step, const std::optional<T_FINDING>& said) = 0;
+    virtual ULF_ITER_WISH Wish(const T_ULF_ITER_STEP& step) = 0;
+    /// May the report that stands there be overwritten? Else it is added to.
+    virtual bool MayOverwrite(const std::string& report) = 0;
+    /// Told before each iteration, and again and again while its analysis runs (so that a window
+    /// stays alive), with the number of those done; false cancels the run, the model and its file
+    /// being as after the last complete iteration.
+    virtual bool GoesOn(int done, int required) = 0;
 };

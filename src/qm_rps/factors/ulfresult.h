@@ -2,6 +2,7 @@
 #pragma once
 
 #include "qm_rps/factors/ulfrecords.h"
+#include "qm_rps/hinge/hingefindings.h"
 
 struct T_ULF_RESULT_CONSTRAINT {
     std::string name;
@@ -33,6 +34,15 @@ struct T_ULF_RUN {
     T_OPT_ANSWER answer;
     std::vector<std::vector<double>> influence; // per constraint: response of every case
     std::vector<std::string> places{};          // of the constraints; empty in a static analysis
+};
+
+/// What a calculation has come to.
+struct T_ULF_CALCULATION {
+    std::optional<T_ULF_RUN> run;       // it reached the optimizer
+    std::optional<T_ULF_RESULT> result; // factors were found
+    /// Without a result why there is none; with one the constraints that equations could not meet
+    /// to 1e-6, if any.
+    std::optional<T_FINDING> said;
 };
 
 /// The result set of a run with these factors, one per unknown: the solved ones, or others to be

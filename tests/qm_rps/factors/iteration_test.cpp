@@ -20,9 +20,12 @@ public:
     int m_busy = 2;
 
     std::string ModelPath() const override { return m_path; }
-    int Solve(std::vector<T_ULF_ITER_ROW>& rows) override
+    int Solve(std::vector<T_ULF_ITER_ROW>& rows, std::optional<T_FINDING>& said) override
     {
-        if (!Do("solve" + std::to_string(m_solved))) return 0;
+        if (!Do("solve" + std::to_string(m_solved))) {
+            said.emplace().text = "no factors";
+            return 0;
+        }
         const auto& f = m_factors[std::min(m_solved++, m_factors.size() - 1)];
         rows = {{"S1/First Step", f[0], true}, {"S2/Last Step", f[1], false}};
         return 1;
@@ -53,10 +56,10 @@ public:
         return Do("analyse");
     }
     bool IsExcuted() override { return m_left > 0; }
-    void DispatchEvents() override
+    void Wait() override
     {
         --m_left;
-        (void)Do("dispatch");
+        (void)Do("wait");
     }
     bool IsPostMode() override { return Do("post") != 0; }
 
@@ -83,11 +86,10 @@ protected:
     }
     int Run(int required = 5, double tolerance = 0.001)
     {
-        CUlfIteration run(m_host, {required, tolerance});
-        run.SetView(&m_person);
-        run.m_progress = m_progress;
+        CUlfIteration run(m_host, m_person, {required, tolerance});
         const int done = run.Run();
         m_end = run.End();
+        m_said = run.Said();
         m_history = run.History();
         return done;
     }
@@ -110,8 +112,8 @@ protected:
     std::string m_folder;
     CScriptedHost m_host;
     CPerson m_person;
-    std::function<bool(int, int)> m_progress;
     ULF_ITER_END m_end{};
+    std::optional<T_FINDING> m_said;
     std::vector<T_ULF_ITER_STEP> m_history;
 };
 
@@ -123,7 +125,7 @@ TEST_F(UlfIteration, AsksTheHostInOrderUntilTheFactorsAreOne)
     EXPECT_EQ(ULF_ITER_END::Converged, m_end);
     EXPECT_EQ((LINES{"solve0", "save frame_01.ext",
                      "start Change load values for iterative analysis", "scale 0 2.00",
-                     "scale 1 7.00", "close", "analyse", "dispatch", "dispatch", "post", "solve1"}),
+                     "scale 1 7.00", "close", "analyse", "wait", "wait", "post", "solve1"}),
               m_host.m_log);
     ASSERT_EQ(2U, m_history.size());
     EXPECT_EQ(1.0, m_history[0].tolerance); // the other unknown's 7 does not enter
@@ -237,14 +239,14 @@ TEST_F(UlfIteration, StopsWhereTheHostRefuses)
         host.m_path = m_folder + "/frame.ext";
         host.m_factors = {{2.0, 7.0}, {1.0, 7.0}};
         host.m_fail = c.fail;
-        CUlfIteration run(host, {});
-        run.SetView(&m_person);
+        CUlfIteration run(host, m_person, {});
         EXPECT_EQ(0, run.Run()) << c.fail;
         EXPECT_EQ(c.end, run.End()) << c.fail;
         EXPECT_EQ(c.last, host.m_log.back()) << c.fail;
         EXPECT_EQ(c.blocks, Blocks()) << c.fail;
         const bool undone = std::count(host.m_log.begin(), host.m_log.end(), "undo") > 0;
         EXPECT_EQ(c.end == ULF_ITER_END::NotAnalysed, undone) << c.fail;
+        EXPECT_EQ(c.end == ULF_ITER_END::NotSolved, run.Said().has_value()) << c.fail;
     }
 }
 
@@ -265,12 +267,12 @@ TEST_F(UlfIteration, GoesOnOnlyWhenThePersonWantsIt)
 TEST_F(UlfIteration, AsksNoMoreInARunInWhichThePersonWantsItSo)
 {
     m_host.m_factors = {{2.0, 7.0}}; // never converges
-    m_person.m_dontAsk = true;
+    m_person.m_unasked = true;
     EXPECT_TRUE(Run(4));
     EXPECT_EQ(ULF_ITER_END::Required, m_end);
-    EXPECT_EQ(1, m_person.m_dialogs);
+    EXPECT_EQ(1, m_person.m_questions);
     EXPECT_TRUE(Run(4)); // another run asks again
-    EXPECT_EQ(2, m_person.m_dialogs);
+    EXPECT_EQ(2, m_person.m_questions);
     m_person.m_accept = 0; // without "iterate" it means nothing
     EXPECT_TRUE(Run(4));
     EXPECT_EQ(ULF_ITER_END::Declined, m_end);
@@ -283,25 +285,23 @@ TEST_F(UlfIteration, AsksBeforeAnExistingReportIsOverwritten)
     for (const bool overwrite : {false, true}) {
         ASSERT_EQ(1, CFileCtrl::WriteWholeFile(path, "old\n", error));
         m_person.m_overwrite = overwrite;
-        m_person.m_asked.clear();
+        m_person.m_reports.clear();
         EXPECT_EQ(1, Run(0));
-        EXPECT_EQ(LINES{"The file(" + path + ") already exists, overwrite?\nSelect 'No' to add"},
-                  m_person.m_asked);
+        EXPECT_EQ(LINES{path}, m_person.m_reports);
         EXPECT_EQ(!overwrite, Report().rfind("old\n         +=", 0) == 0);
         EXPECT_EQ(overwrite, Report().rfind("         +=", 0) == 0);
     }
     std::filesystem::remove(path);
     std::filesystem::create_directory(path); // can't be written
-    m_person.m_asked.clear();
     EXPECT_EQ(0, Run());
     EXPECT_EQ(ULF_ITER_END::ReportNotWritten, m_end);
-    EXPECT_EQ("IDS_QM_ULF_REPORT_NOT_WRITTEN", m_person.m_asked.back());
+    EXPECT_EQ("IDS_QM_ULF_REPORT_NOT_WRITTEN", m_said.value().messageKey);
 }
 
 TEST_F(UlfIteration, CancelsBetweenIterationsWithEverythingReported)
 {
     m_host.m_factors = {{2, 1}};
-    m_progress = [](int done, int required) { return required == 5 && done < 2; };
+    m_person.m_goesOn = [](int done, int required) { return required == 5 && done < 2; };
     EXPECT_EQ(0, Run());
     EXPECT_EQ(ULF_ITER_END::Cancelled, m_end);
     EXPECT_EQ("solve2", m_host.m_log.back());
@@ -314,14 +314,14 @@ TEST_F(UlfIteration, CancelDuringAnAnalysisTakesTheLoadsBack)
     m_host.m_factors = {{2, 1}};
     m_host.m_busy = 3;
     std::vector<int> told;
-    m_progress = [&](int done, int) {
+    m_person.m_goesOn = [&](int done, int) {
         told.push_back(done);
-        return told.size() != 7; // in the second analysis, after its second look at the events
+        return told.size() != 7; // in the second analysis, at its second look
     };
     EXPECT_EQ(0, Run());
     EXPECT_EQ(ULF_ITER_END::Cancelled, m_end);
     EXPECT_EQ((std::vector<int>{0, 0, 0, 0, 1, 1, 1}), told);
-    const LINES end{"analyse", "dispatch", "dispatch", "stop", "post", "undo", "save frame_02.ext"};
+    const LINES end{"analyse", "wait", "stop", "wait", "post", "undo", "save frame_02.ext"};
     ASSERT_GT(m_host.m_log.size(), end.size());
     EXPECT_EQ(end, LINES(m_host.m_log.end() - static_cast<int>(end.size()), m_host.m_log.end()));
     EXPECT_EQ(2U, m_history.size());

@@ -1,8 +1,7 @@
 // The iterative analysis of a real document.
 #include "iterationperson.h"
 #include "qm_db/filectrl.h"
-#include "qm_rps/factors/ulfiterationdochost.h"
-#include "qm_rps/factors/ulfstageresults.h"
+#include "qm_rps/ulfiterationdochost.h"
 #include "twotrusses.h"
 
 #include <filesystem>
@@ -37,10 +36,10 @@ TEST_F(UlfIterationDocument, LeavesTheLoadsWhenOneOfThemCannotBeChanged)
     content.model.loadCases[2].pretension.push_back({9, 1.0}); // there is no such element
     CDBDoc doc;
     doc.Data().Assign(std::move(content));
-    CUlfStageResults results(doc);
-    CUnknownStageItemDlg dialog(doc, results, 1);
-    CUlfIterationDocHost host(doc, dialog, nullptr);
-    (void)dialog.OnCalculate(); // forms the problem; without results there are no factors
+    CUlfIterationDocHost host(doc, doc.Data().Model().ulfStageItems.at(1), false);
+    std::vector<T_ULF_ITER_ROW> rows;
+    std::optional<T_FINDING> said;
+    EXPECT_EQ(0, host.Solve(rows, said)); // forms the problem; without results there are no factors
     ASSERT_EQ(1, host.StartEdit("scale"));
     EXPECT_EQ(0, host.ScalePretension(0, 2.0));
     EXPECT_NE(std::string::npos, host.Error().find('9'));
@@ -59,18 +58,14 @@ TEST_F(UlfIterationDocument, BringsATwoTrussFrameToItsTensionInOneIteration)
     options.allCases = false;
     T_ANALYSIS_ERROR fault;
     ASSERT_EQ(1, doc.RunAnalysis(options, fault)) << fault.text;
-    CUlfStageResults results(doc);
-    CUnknownStageItemDlg dialog(doc, results, 1);
-    CUlfIterationDocHost host(doc, dialog, &m_person);
-    CUlfIteration run(host, {});
-    dialog.SetView(&m_person);
-    ASSERT_EQ(1, dialog.OnIterate(run)) << host.Error();
+    CUlfIterationDocHost host(doc, doc.Data().Model().ulfStageItems.at(1), false);
+    CUlfIteration run(host, m_person, {});
+    ASSERT_EQ(1, run.Run()) << host.Error();
     EXPECT_EQ(ULF_ITER_END::Converged, run.End());
     ASSERT_EQ(2U, run.History().size());
     EXPECT_EQ("S1/First Step", run.History()[0].rows.at(0).place);
     EXPECT_NEAR(4.0, run.History()[0].rows.at(0).factor, 1e-12); // T = 4 holds G
     EXPECT_NEAR(1.0, run.History()[1].rows.at(0).factor, 1e-12);
-    EXPECT_GT(m_person.m_events, 0);
     T_DOF6 u{};
     doc.Post().SelectStage(1, kStageFirstStep, kStageLoadSum);
     ASSERT_EQ(1, doc.Post().GetDspcNew(2, u));
@@ -101,27 +96,19 @@ TEST_F(UlfIterationDocument, LeavesTheDocumentAsAfterTheLastIterationWhenAnAnaly
         options.allCases = false;
         T_ANALYSIS_ERROR fault;
         ASSERT_EQ(1, doc.RunAnalysis(options, fault)) << fault.text;
-        CUlfStageResults results(doc);
-        CUnknownStageItemDlg dialog(doc, results, 1);
-        CUlfIterationDocHost host(doc, dialog, &m_person);
-        CUlfIteration run(host, {});
-        dialog.SetView(&m_person);
+        CUlfIterationDocHost host(doc, doc.Data().Model().ulfStageItems.at(1), false);
+        CUlfIteration run(host, m_person, {});
         m_person.m_overwrite = true;
         double whileRunning = 0.0;
-        bool asked = false;
-        m_person.m_onEvents = [&] {
-            EXPECT_TRUE(doc.IsExcuted());
+        m_person.m_goesOn = [&](int, int) {
+            if (!doc.IsExcuted()) return true; // before the iteration
             EXPECT_FALSE(doc.Edit().Begin("meanwhile"));
             EXPECT_EQ(0, doc.Undo().Undo());
             whileRunning = doc.Data().Model().loadCases.at(2).pretension.at(0).force;
-            asked = cancel;
-            if (cancel)
-                doc.CancelAnalysis();
-            else
-                std::filesystem::remove_all(m_folder); // its results can't be saved
+            if (!cancel) std::filesystem::remove_all(m_folder); // its results can't be saved
+            return !cancel;
         };
-        run.m_progress = [&](int, int) { return !asked; };
-        EXPECT_EQ(0, dialog.OnIterate(run));
+        EXPECT_EQ(0, run.Run());
         EXPECT_EQ(cancel ? ULF_ITER_END::Cancelled : ULF_ITER_END::NotAnalysed, run.End());
         EXPECT_NEAR(4.0, whileRunning, 1e-12);
         EXPECT_EQ(1.0, doc.Data().Model().loadCases.at(2).pretension.at(0).force);

@@ -1,28 +1,14 @@
 // A linear staged model: the factors of its pretension are 1 after a single iteration, since every
 // stage result is proportional to the load that makes it.
-#include "qm_rps/factors/ulfiterationdochost.h"
-#include "qm_rps/factors/ulfstageresults.h"
-#include "qm_rps/ulfiterationresultdlg.h"
+#include "iterationperson.h"
+#include "qm_rps/ulfiterationdochost.h"
 
 #include <filesystem>
-#include <gtest/gtest.h>
 #include <random>
 
 namespace {
 
 constexpr int kInner = 4; // nodes 2 to 5 between the walls 1 and 6
-
-class CWilling : public zql::frx::IDialogView {
-public:
-    void ShowMessage(const std::string&, const std::string&) override {}
-    bool AskYesNo(const std::string&, const std::string&) override { return true; }
-    int RunModal(zql::frx::MDialog& child) override
-    {
-        auto* dialog = dynamic_cast<CUlfIterationResultDlg*>(&child);
-        if (dialog) dialog->m_iterate = true;
-        return dialog ? 1 : 0;
-    }
-};
 
 /// A row of trusses between walls, loaded at stage 1; stages 2 and 3 bring two stays each from a
 /// wall to an inner node, tensioned as they come, stage 3 more load. Each stay's factor is unknown,
@@ -104,13 +90,10 @@ TEST(LinearStages, ConvergeInOneIterationAndMeetEveryConstraint)
         options.allCases = false;
         T_ANALYSIS_ERROR fault;
         ASSERT_EQ(1, doc.RunAnalysis(options, fault)) << seed << ": " << fault.text;
-        CUlfStageResults results(doc);
-        CUnknownStageItemDlg dialog(doc, results, 1);
-        CWilling view;
-        dialog.SetView(&view);
-        CUlfIterationDocHost host(doc, dialog, &view);
-        CUlfIteration run(host, {5, 1e-9});
-        ASSERT_EQ(1, dialog.OnIterate(run)) << seed << ": " << host.Error();
+        CUlfIterationDocHost host(doc, doc.Data().Model().ulfStageItems.at(1), false);
+        CPerson willing;
+        CUlfIteration run(host, willing, {5, 1e-9});
+        ASSERT_EQ(1, run.Run()) << seed << ": " << host.Error();
         EXPECT_EQ(ULF_ITER_END::Converged, run.End()) << seed;
         ASSERT_EQ(2U, run.History().size()) << seed;
         EXPECT_GT(run.History()[0].tolerance, 1e-3) << seed << ": nothing was to be done";

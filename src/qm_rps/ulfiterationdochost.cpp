@@ -1,7 +1,10 @@
-#include "qm_rps/factors/ulfiterationdochost.h"
+#include "qm_rps/ulfiterationdochost.h"
 
 #include "qm_base/messagehistory.h"
 #include "qm_base/msgfunction.h"
+#include "qm_rps/factors/ulfstageplace.h"
+#include "qm_rps/factors/ulfstageproblem.h"
+#include "qm_rps/factors/ulfstageresults.h"
 
 #include <set>
 
@@ -14,13 +17,31 @@ int CUlfIterationDocHost::Refuse(const std::string& text)
     return 0;
 }
 
-int CUlfIterationDocHost::Solve(std::vector<T_ULF_ITER_ROW>& rows)
+std::vector<T_ULF_ITER_ROW> CUlfIterationDocHost::RowsOf(const T_ULF_RUN& run) const
 {
-    if (!m_dialog.OnCalculate()) {
-        m_error = m_dialog.Messages().empty() ? "" : m_dialog.Messages().back().text;
+    std::vector<T_ULF_ITER_ROW> rows;
+    for (std::size_t i = 0; i < m_unknowns.size(); ++i) {
+        const T_ULSI_ROW& row = m_item.rows[m_unknowns[i]];
+        rows.push_back({UlfPlaceText(m_doc.Data(), row.stage, row.step), run.answer.factors[i],
+                        row.pretension, m_doc.Data().Model().loadCases.at(row.loadCase).name});
+    }
+    return rows;
+}
+
+int CUlfIterationDocHost::Solve(std::vector<T_ULF_ITER_ROW>& rows, std::optional<T_FINDING>& said)
+{
+    CUlfStageResults results(m_doc);
+    CUlfStageResponse source(results);
+    source.m_sumStageLoads = m_sumStageLoads;
+    T_ULF_CALCULATION calculation = CalculateUlfStages(m_doc, m_item, source);
+    said = calculation.said;
+    m_unknowns = calculation.run->formed.unknowns;
+    if (!calculation.result) {
+        m_error = said->text;
         return 0;
     }
-    rows = m_dialog.SolvedRows();
+    rows = RowsOf(*calculation.run);
+    m_result = std::move(calculation.result);
     return 1;
 }
 
@@ -59,7 +80,7 @@ int CUlfIterationDocHost::ScaleLoad(int loadCase, double factor)
 
 int CUlfIterationDocHost::ScalePretension(std::size_t unknown, double factor)
 {
-    const T_ULSI_ROW& row = m_dialog.m_rows[m_dialog.RowOfUnknown(unknown)];
+    const T_ULSI_ROW& row = m_item.rows[m_unknowns[unknown]];
     for (const int loadCase : LoadsScaledBy(m_doc.Data().Model(), row))
         if (!ScaleLoad(loadCase, factor)) return 0;
     return 1;
@@ -98,12 +119,10 @@ int CUlfIterationDocHost::EndAnalysis()
     return error.fault == ANALYSIS_FAULT::Cancelled ? 0 : Refuse(error.text);
 }
 
-void CUlfIterationDocHost::DispatchEvents()
+void CUlfIterationDocHost::Wait()
 {
     constexpr int kWaitMs = 2; // short enough for a window
-    if (m_view) m_view->DispatchEvents();
-    if (!m_doc.IsExcuted()) return;
-    if (m_doc.PollAnalysis(kWaitMs)) return;
+    if (!m_doc.IsExcuted() || m_doc.PollAnalysis(kWaitMs)) return;
     m_isAnalysed = EndAnalysis() != 0;
     if (m_isAnalysed) m_before = nullptr;
 }

@@ -1,18 +1,20 @@
 // The iterative analysis on a document and its construction-stage item.
 #pragma once
 
-#include "qm_rps/unknownstageitemdlg.h"
+#include "qm_rps/factors/ulfiterationhost.h"
+#include "qm_rps/ulfcalculation.h"
 
 class CUlfIterationDocHost : public IUlfIterationHost {
 public:
-    /// Document and dialog must outlive the host; refusals are shown by the dialog.
-    CUlfIterationDocHost(CDBDoc& doc, CUnknownStageItemDlg& dialog, zql::frx::IDialogView* view)
-        : m_doc(doc), m_dialog(dialog), m_view(view)
+    /// An item that keeps its rules. The document must outlive the host.
+    CUlfIterationDocHost(CDBDoc& doc, T_ULSI_D item, bool sumStageLoads)
+        : m_doc(doc), m_item(std::move(item)), m_sumStageLoads(sumStageLoads)
     {
     }
 
     std::string ModelPath() const override { return m_doc.Path(); }
-    [[nodiscard]] int Solve(std::vector<T_ULF_ITER_ROW>& rows) override;
+    [[nodiscard]] int Solve(std::vector<T_ULF_ITER_ROW>& rows,
+                            std::optional<T_FINDING>& said) override;
     [[nodiscard]] int SaveCopy(const std::string& path) override;
     [[nodiscard]] int StartEdit(const std::string& title) override;
     /// Reads and writes back each pretension of the loads that the row scales (LoadsScaledBy).
@@ -25,23 +27,28 @@ public:
     [[nodiscard]] int StartAnalysis() override;
     bool IsExcuted() override { return m_doc.IsExcuted(); }
     void CancelAnalysis() override { m_doc.CancelAnalysis(); }
-    /// Those of the view; waits for the analysis a little. When it has ended the model is saved, so
-    /// that its file has the loads of the results, and the results.
-    void DispatchEvents() override;
+    /// When the analysis has ended the model is saved, so that its file has the loads of the
+    /// results, and the results.
+    void Wait() override;
     /// Also false when the latest analysis failed or its results were not saved.
     bool IsPostMode() override { return m_isAnalysed && m_doc.IsPostMode(); }
 
     /// Why the latest operation was refused, in words.
     const std::string& Error() const { return m_error; }
+    /// Of the latest solution.
+    const std::optional<T_ULF_RESULT>& Result() const { return m_result; }
 
 private:
+    std::vector<T_ULF_ITER_ROW> RowsOf(const T_ULF_RUN& run) const;
     [[nodiscard]] int ScaleLoad(int loadCase, double factor);
     int Refuse(const std::string& text);
     [[nodiscard]] int EndAnalysis();
 
     CDBDoc& m_doc;
-    CUnknownStageItemDlg& m_dialog;
-    zql::frx::IDialogView* m_view;
+    T_ULSI_D m_item;
+    bool m_sumStageLoads;
+    std::vector<std::size_t> m_unknowns; // rows of the item, of the latest problem
+    std::optional<T_ULF_RESULT> m_result;
     std::string m_error;
     bool m_isScaled = false;                 // the latest edit has changed a load
     bool m_isAnalysed = true;                // the latest analysis has its results, in the file too
