@@ -1,8 +1,8 @@
 // What the iterative analysis for pretension asks of the program and of the person around it.
 #pragma once
 
+#include "qm_base/finding.h"
 #include "qm_rps/factors/ulfiterationreport.h"
-#include "qm_rps/hinge/hingefindings.h"
 
 #include <optional>
 

@@ -1,8 +1,8 @@
 // Result set of a solved unknown load factor item, and its table.
 #pragma once
 
+#include "qm_base/finding.h"
 #include "qm_rps/factors/ulfrecords.h"
-#include "qm_rps/hinge/hingefindings.h"
 
 struct T_ULF_RESULT_CONSTRAINT {
     std::string name;
