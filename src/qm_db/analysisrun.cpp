@@ -3,6 +3,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_db/analysis/analysismodel.h"
 #include "qm_db/analysis/stagedanalysis.h"
+#include "qm_db/editscope.h"
 #include "qm_db/results/fingerprint.h"
 
 #include <algorithm>
@@ -89,24 +90,20 @@ int FindModes(T_RUN& run, std::vector<T_EIGV_D>& out, T_ANALYSIS_ERROR& error)
 
 int CAnalysisRun::KeepModes(std::vector<T_EIGV_D> modes)
 {
-    const bool own = !m_edit.IsOpen();
-    if (own && !m_edit.Begin(zql::lib::MMSGFunction::GetValue("IDS_QM_DB_STEP_MODES"))) return 0;
-    int done = 1;
-    std::vector<int> old;
-    for (const auto& entry : m_data.Model().modes)
-        old.push_back(entry.first);
-    for (const int key : old)
-        done = done && m_edit.Erase<T_EIGV_D>(key);
+    CEditScope edit(m_doc, zql::lib::MMSGFunction::GetValue("IDS_QM_DB_STEP_MODES"),
+                    EDIT_STEP::Join);
+    for (const int key : m_doc.Attr().GetKeys<T_EIGV_D>())
+        if (!edit.Erase<T_EIGV_D>(key)) return 0;
     for (std::size_t i = 0; i < modes.size(); ++i)
-        done = done && m_edit.Put(static_cast<int>(i) + 1, std::move(modes[i]));
-    return own ? done && m_edit.Commit() : done;
+        if (!edit.Put(static_cast<int>(i) + 1, std::move(modes[i]))) return 0;
+    return edit.Commit();
 }
 
 int CAnalysisRun::Keep(T_ANALYSIS_RESULTS results)
 {
-    if (results.staged) m_data.SetStagedResult(std::move(results.staged));
+    if (results.staged) m_doc.Data().SetStagedResult(std::move(results.staged));
     for (auto& [key, result] : results.cases)
-        m_data.SetStaticResult(key, std::move(result));
+        m_doc.Data().SetStaticResult(key, std::move(result));
     return results.modes ? KeepModes(std::move(*results.modes)) : 1;
 }
 

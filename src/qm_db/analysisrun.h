@@ -4,6 +4,8 @@
 #include "qm_db/analysis/analysisoptions.h"
 #include "qm_db/editdata.h"
 
+class CDBDoc;
+
 /// What an analysis has found.
 struct T_ANALYSIS_RESULTS {
     T_STATIC_MAP cases;                         // of the load cases that were asked for
@@ -16,7 +18,7 @@ struct T_ANALYSIS_RESULTS {
 /// the model's modes, as an edit that can be undone.
 class CAnalysisRun {
 public:
-    CAnalysisRun(CDataCtrl& data, CEditData& edit) : m_data(data), m_edit(edit) {}
+    explicit CAnalysisRun(CDBDoc& doc) : m_doc(doc) {}
 
     /// Reads the model and changes nothing. One factorisation serves all load cases and the modes;
     /// construction stages have their own, whose symbolic part is that of `before` (results of an
@@ -31,6 +33,5 @@ public:
 private:
     [[nodiscard]] int KeepModes(std::vector<T_EIGV_D> modes);
 
-    CDataCtrl& m_data;
-    CEditData& m_edit;
+    CDBDoc& m_doc;
 };

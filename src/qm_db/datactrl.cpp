@@ -1,6 +1,6 @@
 #include "qm_db/datactrl.h"
 
-#include "qm_db/editdata.h"
+#include "qm_db/editscope.h"
 #include "qm_db/records/lcomflatten.h"
 
 #include <algorithm>
@@ -47,10 +47,8 @@ int CDataCtrl::AddLcom(const T_LCOM_D& combination)
     if (!m_editor || combination.name.empty() || taken ||
         !FlattenLcom(Model(), combination, flat, ignored))
         return 0;
-    const int key = table.empty() ? 1 : table.rbegin()->first + 1;
-    if (m_editor->IsOpen()) return m_editor->Put(key, combination);
-    return m_editor->Begin(combination.name) && m_editor->Put(key, combination) &&
-           m_editor->Commit();
+    CEditScope edit(*m_editor, combination.name, EDIT_STEP::Join);
+    return edit.Put(NextKey(table), combination) && edit.Commit();
 }
 
 T_MODEL& CDataCtrl::ModelForEdit()

@@ -175,7 +175,7 @@ void CDBDoc::EndAnalysis()
         m_outcome = Failure(ANALYSIS_FAULT::Cancelled, "cancelled");
     else if (done && m_data.Revision() != m_revisionAtStart)
         m_outcome = Failure(ANALYSIS_FAULT::Failed, "the model was changed during the analysis");
-    else if (done && !CAnalysisRun(m_data, m_edit).Keep(std::move(results)))
+    else if (done && !CAnalysisRun(*this).Keep(std::move(results)))
         m_outcome = Failure(ANALYSIS_FAULT::Failed, "the modes could not be changed");
 }
 

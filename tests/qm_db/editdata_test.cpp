@@ -1,4 +1,4 @@
-#include "qm_db/dbdoc.h"
+#include "qm_db/editscope.h"
 
 #include <gtest/gtest.h>
 
@@ -88,6 +88,49 @@ TEST(EditData, RollbackRestoresEveryRecord)
     EXPECT_EQ(before, doc.Data().Model());
     EXPECT_FALSE(doc.Undo().CanUndo());
     EXPECT_FALSE(doc.Edit().IsOpen());
+}
+
+TEST(EditScope, AnEditThatIsNotCommittedOrHasARefusedChangeIsTakenBack)
+{
+    CDBDoc doc;
+    doc.Data().Assign(SmallModel());
+    const T_MODEL before = doc.Data().Model();
+    {
+        CEditScope edit(doc, "left");
+        ASSERT_EQ(1, edit.Put(2, T_NODE_D{2, {0, 0, 6}, {}, {}}));
+        EXPECT_TRUE(doc.Data().Model().nodes.contains(2));
+    }
+    {
+        CEditScope edit(doc, "refused");
+        ASSERT_EQ(1, edit.Put(2, T_NODE_D{2, {0, 0, 6}, {}, {}}));
+        EXPECT_EQ(0, edit.Erase<T_NODE_D>(1)); // of the storey
+        EXPECT_EQ(0, edit.Commit());
+    }
+    EXPECT_EQ(before, doc.Data().Model());
+    EXPECT_FALSE(doc.Edit().IsOpen() || doc.Undo().CanUndo());
+}
+
+TEST(EditScope, AStepThatIsOpenIsJoinedOrLeftAlone)
+{
+    CDBDoc doc;
+    doc.Data().Assign(SmallModel());
+    CEditScope outer(doc, "outer");
+    {
+        CEditScope own(doc, "own");
+        EXPECT_FALSE(own.IsOpen());
+        EXPECT_EQ(0, own.Put(2, T_NODE_D{2, {0, 0, 6}, {}, {}}));
+        EXPECT_EQ(0, own.Commit());
+    }
+    {
+        CEditScope joined(doc, "joined", EDIT_STEP::Join);
+        ASSERT_EQ(1, joined.Put(3, T_NODE_D{3, {0, 0, 9}, {}, {}}));
+        ASSERT_EQ(1, joined.Commit());
+    }
+    EXPECT_FALSE(doc.Undo().CanUndo());
+    ASSERT_EQ(1, outer.Commit());
+    EXPECT_EQ("outer", doc.Undo().UndoTitle());
+    EXPECT_FALSE(doc.Data().Model().nodes.contains(2));
+    EXPECT_TRUE(doc.Data().Model().nodes.contains(3));
 }
 
 // A refused edit must not make the document ask to be saved.

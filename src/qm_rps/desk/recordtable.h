@@ -2,6 +2,7 @@
 #pragma once
 
 #include "qm_base/msgfunction.h"
+#include "qm_db/editscope.h"
 #include "qm_rps/desk/recordcolumns.h"
 
 #include <algorithm>
@@ -53,17 +54,17 @@ public:
 
     int SetCellText(std::size_t row, std::size_t c, const std::string& text) override
     {
-        return Edit([&] { return Take(row, c, text); });
+        return Edit([&](CEditScope& edit) { return Take(edit, row, c, text); });
     }
 
     int Paste(const std::string& text, const T_GRID_RANGE& range) override
     {
         const T_GRID_BLOCK block = BlockOfText(text);
         if (const char* key = WrongShape(block, range, Rows(), Columns())) return Say(key);
-        return Edit([&] {
+        return Edit([&](CEditScope& edit) {
             for (std::size_t r = 0; r < block.size(); ++r)
                 for (std::size_t c = 0; c < block[r].size(); ++c)
-                    if (!Take(range.row + r, range.column + c, block[r][c])) return 0;
+                    if (!Take(edit, range.row + r, range.column + c, block[r][c])) return 0;
             return 1;
         });
     }
@@ -72,8 +73,8 @@ public:
     int OnAdd() override
     {
         if (!m_makeNew) return 0;
-        const int key = Keys().empty() ? 1 : Keys().back() + 1;
-        return Edit([&] { return m_doc.Edit().Put(key, m_makeNew(Model(), key)); });
+        const int key = NextKey(TableOf<R>(Model()));
+        return Edit([&](CEditScope& edit) { return edit.Put(key, m_makeNew(Model(), key)); });
     }
 
     int OnDelete(const std::vector<std::size_t>& rows) override
@@ -82,8 +83,8 @@ public:
         for (const std::size_t row : rows)
             if (KeyOf(row) != 0) keys.push_back(KeyOf(row));
         if (keys.empty()) return 0;
-        return Edit([&] {
-            return std::ranges::all_of(keys, [&](int key) { return EraseOne(key) != 0; }) ? 1 : 0;
+        return Edit([&](CEditScope& edit) {
+            return std::ranges::all_of(keys, [&](int key) { return EraseOne(edit, key) != 0; });
         });
     }
 
@@ -113,29 +114,25 @@ private:
     template <class F>
     int Edit(F change)
     {
-        CEditData& edit = m_doc.Edit();
-        if (!edit.Begin(zql::lib::MMSGFunction::GetValue(m_title)))
-            return Say("IDS_QM_UI_EDIT_BUSY");
-        if (change() && edit.Commit()) return 1;
-        edit.Rollback();
-        return 0;
+        CEditScope edit(m_doc, zql::lib::MMSGFunction::GetValue(m_title));
+        if (!edit.IsOpen()) return Say("IDS_QM_UI_EDIT_BUSY");
+        return change(edit) && edit.Commit();
     }
-    int Take(std::size_t row, std::size_t c, const std::string& text)
+    int Take(CEditScope& edit, std::size_t row, std::size_t c, const std::string& text)
     {
         const int key = KeyOf(row);
         if (key == 0 || !CanEdit(c)) return Say("IDS_QM_UI_CELL_FIXED");
         R record = Read(key);
-        if (m_columns[c].set(Model(), record, text) && m_doc.Edit().Put(key, std::move(record)))
-            return 1;
+        if (m_columns[c].set(Model(), record, text) && edit.Put(key, std::move(record))) return 1;
         constexpr const char* kKey = "IDS_QM_UI_CELL_REFUSED";
         ShowMessage(
             kKey, zql::lib::MMSGFunction::Format(kKey, {text, ColumnHead(c), std::to_string(key)}));
         return 0;
     }
-    int EraseOne(int key)
+    int EraseOne(CEditScope& edit, int key)
     {
         T_RECORD_USERS users;
-        if (m_doc.Edit().template Erase<R>(key, users)) return 1;
+        if (edit.Erase<R>(key, users)) return 1;
         std::string names;
         constexpr std::size_t kNamed = 10;
         for (std::size_t i = 0; i < users.size() && i < kNamed; ++i)
