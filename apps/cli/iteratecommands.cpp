@@ -4,7 +4,7 @@
 #include "inputfile.h"
 #include "output.h"
 #include "qm_base/textformat.h"
-#include "qm_rps/factors/ulfstageproblem.h"
+#include "qm_rps/factors/ulfitemchecks.h"
 #include "qm_rps/ulfiterationdochost.h"
 #include "qm_rps/unknownloadfactoriteranal.h"
 #include "ulfrun.h"

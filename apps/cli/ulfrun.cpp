@@ -6,7 +6,6 @@
 #include "output.h"
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
-#include "qm_rps/factors/ulfchecks.h"
 #include "qm_rps/unknownloadfactoritemdlg.h"
 #include "qm_rps/unknownstageitemdlg.h"
 

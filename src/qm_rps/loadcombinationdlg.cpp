@@ -2,21 +2,13 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/factors/ulfcombinationchecks.h"
 
 #include <algorithm>
 
 using zql::lib::MMSGFunction;
 
 namespace {
-
-T_FINDING Finding(const char* field, const char* key, const std::string& text)
-{
-    T_FINDING f;
-    f.field = field;
-    f.ruleText = f.messageKey = key;
-    f.text = text;
-    return f;
-}
 
 bool Same(const T_LCOM_ITEM& a, const T_LCOM_ITEM& b)
 {
@@ -113,21 +105,7 @@ std::string CLoadCombinationDlg::FlatText() const
 
 std::vector<T_FINDING> CLoadCombinationDlg::Findings() const
 {
-    std::vector<T_FINDING> found;
-    const auto add = [&](const char* field, const char* key) {
-        found.push_back(Finding(field, key, MMSGFunction::Format(key, {m_combination.name})));
-    };
-    int key = 0;
-    if (m_combination.name.empty())
-        add("name", "IDS_RPS_UNKNOWN_LOAD_NAME_NOTENTERED");
-    else if (m_doc.Attr().GetLcomKey(m_combination.name, key) && key != m_key)
-        add("name", "IDS_RPS_UNKNOWN_LOAD_LCOM_EXIST");
-    if (m_combination.items.empty()) add("items", "IDS_QM_UI_LCOM_EMPTY");
-    T_LCOM_D flat;
-    std::string error;
-    if (!m_doc.Attr().NormalizeLcom(m_combination, flat, error))
-        found.push_back(Finding("items", "IDS_QM_UI_LCOM_EMPTY", error));
-    return found;
+    return CheckCombination(m_combination, m_key, m_doc.Data());
 }
 
 int CLoadCombinationDlg::OnOK()

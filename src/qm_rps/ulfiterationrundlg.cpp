@@ -4,7 +4,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/factors/ulfanalysis.h"
-#include "qm_rps/factors/ulfstageproblem.h"
+#include "qm_rps/factors/ulfitemchecks.h"
 #include "qm_rps/ulfiterationdochost.h"
 #include "qm_rps/unknownloadfactoriteranaldlg.h"
 #include "qm_rps/unknownloadfactorresultdlg.h"

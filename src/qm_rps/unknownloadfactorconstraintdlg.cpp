@@ -1,7 +1,7 @@
 #include "qm_rps/unknownloadfactorconstraintdlg.h"
 
 #include "qm_base/msgfunction.h"
-#include "qm_rps/factors/ulfchecks.h"
+#include "qm_rps/factors/ulfconstraintchecks.h"
 #include "qm_rps/factors/ulfstageplace.h"
 #include "qm_rps/factors/ulftexts.h"
 

@@ -1,7 +1,8 @@
 #include "qm_rps/unknownloadfactoritemdlg.h"
 
 #include "qm_base/textformat.h"
-#include "qm_rps/factors/ulfchecks.h"
+#include "qm_rps/factors/ulfcombination.h"
+#include "qm_rps/factors/ulfitemchecks.h"
 #include "qm_rps/ulfcalculation.h"
 
 #include <algorithm>
@@ -17,15 +18,6 @@ CUnknownLoadFactorItemDlg::CUnknownLoadFactorItemDlg(CDBDoc& doc, int key)
         if (!combinations.empty()) item.combination = combinations.front();
     }
     Data2Dlg(item);
-}
-
-std::optional<T_LCOM_D> CUnknownLoadFactorItemDlg::Normalised(int combination) const
-{
-    T_LCOM_D record, flat;
-    const CAttrCtrl& attr = m_doc.Attr();
-    if (!attr.GetLcom(combination, record) || !attr.NormalizeLcom(record, flat))
-        return std::nullopt;
-    return flat;
 }
 
 void CUnknownLoadFactorItemDlg::Data2Dlg(const T_ULFI_D& item)
@@ -46,7 +38,7 @@ void CUnknownLoadFactorItemDlg::OnSelChangeCombination(int key)
     std::vector<T_ULFI_UNKNOWN> before = Record().unknowns;
     m_combination = key;
     m_cases.clear();
-    if (const std::optional<T_LCOM_D> flat = Normalised(key))
+    if (const std::optional<T_LCOM_D> flat = FlatCombination(m_doc.Data(), key))
         for (const T_LCOM_ITEM& entry : flat->items) {
             T_STLD_D loadCase;
             if (!m_doc.Attr().GetStld(entry.key, loadCase)) continue;
@@ -115,9 +107,7 @@ int CUnknownLoadFactorItemDlg::SetCell(std::size_t row, COLUMN column, const std
 
 std::vector<T_FINDING> CUnknownLoadFactorItemDlg::Findings() const
 {
-    std::optional<std::vector<T_LCOM_ITEM>> cases;
-    if (const std::optional<T_LCOM_D> flat = Normalised(m_combination)) cases = flat->items;
-    return CheckUlfItem(Record(), m_key, m_doc.Data().Model(), cases);
+    return CheckUlfItem(Record(), m_key, m_doc.Data());
 }
 
 int CUnknownLoadFactorItemDlg::OnOK()

@@ -50,7 +50,6 @@ public:
 private:
     T_ULF_CALCULATION Calculated() override;
     std::optional<T_ANALYSIS_OPTIONS> MissingResults() const override;
-    std::optional<T_LCOM_D> Normalised(int combination) const;
 
     int m_key = 0;
     int m_combination = 0;

@@ -4,6 +4,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/factors/ulfcombination.h"
+#include "qm_rps/factors/ulfcombinationchecks.h"
 #include "qm_rps/factors/ulftexts.h"
 
 #include <filesystem>
@@ -19,9 +20,9 @@ std::string NumberText(const std::optional<double>& value)
 
 } // namespace
 
-int CUnknownLoadFactorResultDlg::Refuse(const char* key, const std::string& name)
+int CUnknownLoadFactorResultDlg::Refuse(std::string reason)
 {
-    m_outcome = MMSGFunction::Format(key, {name});
+    m_outcome = std::move(reason);
     GSaveHistoryFormatNF("%s", m_outcome.c_str());
     return 0;
 }
@@ -104,25 +105,23 @@ int CUnknownLoadFactorResultDlg::OnExport(const std::string& path,
 
 int CUnknownLoadFactorResultDlg::CheckData()
 {
-    if (m_result.stage) return Refuse("IDS_QM_ULSI_NO_COMBINATION", m_result.item.name);
-    if (m_combinationName.empty()) return Refuse("IDS_RPS_UNKNOWN_LOAD_NAME_NOTENTERED");
-    if (m_doc.Attr().ExistLcom(m_combinationName))
-        return Refuse("IDS_RPS_UNKNOWN_LOAD_LCOM_EXIST", m_combinationName);
-    return 1;
+    if (m_result.stage)
+        return Refuse(MMSGFunction::Format("IDS_QM_ULSI_NO_COMBINATION", {m_result.item.name}));
+    const auto found = CheckCombinationName(m_combinationName, 0, m_doc.Data().Model());
+    return found.empty() ? 1 : Refuse(found.front().text);
 }
 
 int CUnknownLoadFactorResultDlg::OnMakeCombination()
 {
     if (!CheckData()) return 0;
-    T_LCOM_D combination, flat;
-    if (!m_doc.Attr().GetLcom(m_result.item.combination, combination) ||
-        !m_doc.Attr().NormalizeLcom(combination, flat))
-        return Refuse("IDS_RPS_UNKNOWN_LOAD_LCOM_FAIL", m_combinationName);
+    const std::optional<T_LCOM_D> flat = FlatCombination(m_doc.Data(), m_result.item.combination);
+    if (!flat)
+        return Refuse(MMSGFunction::Format("IDS_RPS_UNKNOWN_LOAD_LCOM_FAIL", {m_combinationName}));
     std::map<int, double> factors;
     for (std::size_t i = 0; i < m_result.cases.size(); ++i)
         factors[m_result.cases[i].key] = m_result.factors[i];
     const int made = AddUlfCombinations(m_doc, m_combinationName,
-                                        PlanUlfCombinations(m_combinationName, flat, factors));
+                                        PlanUlfCombinations(m_combinationName, *flat, factors));
     m_outcome = MMSGFunction::Format(made ? "IDS_RPS_UNKNOWN_LOAD_LCOM_SUCCESS"
                                           : "IDS_RPS_UNKNOWN_LOAD_LCOM_FAIL",
                                      {m_combinationName});

@@ -66,7 +66,7 @@ public:
 
 private:
     const T_ULF_RESULT_ROW& RowAt(std::size_t constraint) const;
-    int Refuse(const char* key, const std::string& name = {});
+    int Refuse(std::string reason);
 
     CDBDoc& m_doc;
     T_ULF_RESULT m_result;

@@ -38,6 +38,14 @@ int AddParts(CDBDoc& doc, const std::string& name, const std::vector<T_LCOM_D>& 
 
 } // namespace
 
+std::optional<T_LCOM_D> FlatCombination(const CDataCtrl& data, int key)
+{
+    const CAttrCtrl attr(data);
+    T_LCOM_D record, flat;
+    if (!attr.GetLcom(key, record) || !attr.NormalizeLcom(record, flat)) return std::nullopt;
+    return flat;
+}
+
 T_ULF_COMBINATION_PLAN PlanUlfCombinations(const std::string& name, const T_LCOM_D& normalised,
                                            const std::map<int, double>& factors)
 {

@@ -1,9 +1,13 @@
-// Load combinations from solved load factors.
+// Load combinations: flattened, and made from solved load factors.
 #pragma once
 
 #include "qm_db/dbdoc.h"
 
 #include <map>
+#include <optional>
+
+/// A combination as load cases with factors; empty: it is gone, or contains itself.
+std::optional<T_LCOM_D> FlatCombination(const CDataCtrl& data, int key);
 
 /// Combinations to add: one, or several parts and a master that refers to them.
 struct T_ULF_COMBINATION_PLAN {

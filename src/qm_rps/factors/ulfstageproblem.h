@@ -1,8 +1,6 @@
-// From a construction-stage item and its constraints to the optimizer's records, and its rules.
+// From a construction-stage item and its constraints to the optimizer's records.
 #pragma once
 
-#include "qm_base/ruletable.h"
-#include "qm_db/datactrl.h"
 #include "qm_rps/factors/ulfrecords.h"
 #include "qm_rps/factors/ulfstageresponse.h"
 
@@ -26,9 +24,3 @@ T_ULF_STAGE_FORMED FormUlfStageProblem(const T_ULSI_D& item, std::span<const T_U
 /// Load cases whose pretension an unknown row scales: its own one where the row reads its own
 /// result, else all that act at its stage and step. None of a row without the pretension flag.
 std::vector<int> LoadsScaledBy(const T_MODEL& model, const T_ULSI_ROW& row);
-
-/// Rules that an item does not keep, in the order of the dialog's check: its own first, then those
-/// of the constraints that it names. Its name is also that of no static item. What is wrong with a
-/// row is told once for each such row, with its number from 1, stage/step and load case, field
-/// "rows[1]". ownKey: its key in the model, 0 for a new one.
-std::vector<T_FINDING> CheckUlfStageItem(const T_ULSI_D& item, int ownKey, const CDataCtrl& data);

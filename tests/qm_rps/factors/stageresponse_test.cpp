@@ -1,3 +1,4 @@
+#include "qm_rps/factors/ulfitemchecks.h"
 #include "qm_rps/factors/ulfstageplace.h"
 #include "qm_rps/factors/ulfstageproblem.h"
 #include "qm_rps/factors/ulfstageresponse.h"
