@@ -4,6 +4,7 @@
 #include "qm_rps/unknowntabletabgrid1.h"
 
 #include <algorithm>
+#include <span>
 
 namespace {
 
