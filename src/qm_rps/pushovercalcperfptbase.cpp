@@ -1,48 +1,20 @@
 #include "qm_rps/pushovercalcperfptbase.h"
 
-#include "qm_base/appbase.h"
 #include "qm_base/debugout.h"
 #include "qm_base/logfile.h"
 #include "qm_base/testenvmgr.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/pushover/fema440coefficients.h"
-#include "qm_rps/pushover/pushoverbilinear.h"
-
-#include <algorithm>
-#include <array>
-#include <cmath>
+#include "qm_rps/pushover/releaseassert.h"
 
 namespace {
 
 constexpr const char* kSource = "src/qm_rps/pushovercalcperfptbase";
-constexpr double kFullLoopPct = 63.7; // 200 / pi as ATC-40 prints it: a rectangular loop
-constexpr double kMaxBeta0 = 45.0;    // hysteretic damping is not taken above this, per cent
-
-struct T_KAPPA_ROW {
-    int type;
-    double kneePct; // kappa is `flat` up to this hysteretic damping
-    double flat;
-    double k0, k1; // beyond: k0 - k1 * fraction
-};
-
-// ATC-40 (1996) Table 8-1, structural behaviour types A, B, C.
-// clang-format off
-constexpr std::array<T_KAPPA_ROW, 3> kKappa{{
-    {0, 16.25,    1.00, 1.130, 0.510},
-    {1, 25.00,    0.67, 0.845, 0.446},
-    {2, INFINITY, 0.33, 0.000, 0.000},
-}};
-// clang-format on
-
-void Assert(int line)
-{
-    if (CAppBase::IsReleaseAssert_ST()) CAppBase::ReleaseAssertion_ST(kSource, line);
-}
 
 } // namespace
 
 CPushOverCalcPerfPtBase::CPushOverCalcPerfPtBase(CPushOverPerfPtRecord& owner)
-    : m_owner(owner), m_pi(4.0 * std::atan(1.0))
+    : m_owner(owner), m_operations(owner)
 {
     m_trace.reserve(16);
 }
@@ -55,7 +27,7 @@ int CPushOverCalcPerfPtBase::CalcPerformancePoint(double& Dp, double& Ap,
     if (Capacity().Sd.size() < 2) return End(PUSH_OUTCOME::NoCapacity, kPerfPtNone);
     double dpi = 0.0, api = 0.0, Dd = 0.0, Ad = 0.0;
     if (!FindInitialTrialPoint(Capacity().Sd[1], Capacity().Sa[1], dpi, api, Dd, Ad)) {
-        Assert(__LINE__);
+        ReleaseAssert(kSource, __LINE__);
         return kPerfPtNone;
     }
     T_POINT2 change;
@@ -84,83 +56,6 @@ int CPushOverCalcPerfPtBase::FindInitialTrialPoint(double D1, double A1, double&
     return 1;
 }
 
-int CPushOverCalcPerfPtBase::FindFirstSlopeChange(double& D, double& A)
-{
-    constexpr double kZero = 1e-26;
-    constexpr double kChange = 0.1;
-    const auto& [Sd, Sa] = Capacity();
-    const auto ratio = [&](std::size_t i) {
-        return (Sa[i + 1] / Sa[i] - 1.0) / (Sd[i + 1] / Sd[i] - 1.0);
-    };
-    for (std::size_t i = 0; i + 2 < Sd.size(); ++i) {
-        if (std::fabs(Sd[i] * Sa[i]) < kZero || std::fabs(Sd[i + 1] * Sa[i + 1]) < kZero) {
-            Assert(__LINE__);
-            return 0;
-        }
-        const double r1 = ratio(i), r2 = ratio(i + 1);
-        if (!std::isfinite(r1) || !std::isfinite(r2)) return 0;
-        if (std::fabs(r1 - r2) > kChange) {
-            D = Sd[i + 1];
-            A = Sa[i + 1];
-            return 1;
-        }
-        D = Sd[i + 2];
-        A = Sa[i + 2];
-    }
-    return 0;
-}
-
-int CPushOverCalcPerfPtBase::CalcCapacityArea(double d, double& area)
-{
-    const double sum = CurveArea(Capacity().View(), d);
-    if (!std::isfinite(sum)) return 0;
-    area = sum;
-    return 1;
-}
-
-int CPushOverCalcPerfPtBase::BilinearizeAt(double dpi, double api, double& dy, double& ay)
-{
-    constexpr double kZero = 1e-13;
-    constexpr double kOnLine = 0.1;      // ratio this close to 1: on the initial stiffness
-    constexpr double kSamePoint = 1e-12; // relative
-    const double Sd1 = Capacity().Sd[1], Sa1 = Capacity().Sa[1];
-    for (const double v : {dpi, api, Sa1, Sd1}) {
-        if (std::fabs(v) < kZero) {
-            Assert(__LINE__);
-            return 0;
-        }
-    }
-    // The first point and its half point have the ratio 1.
-    const double x = dpi / Sd1 - 1.0;
-    const double ratio = std::fabs(x) <= kSamePoint ? 1.0 : (api / Sa1 - 1.0) / x;
-    if (std::fabs(1.0 - ratio) < kOnLine) {
-        dy = dpi;
-        ay = api;
-        return 1;
-    }
-    double area = 0.0;
-    if (!CalcCapacityArea(dpi, area)) return 0;
-    const double den = Sa1 * dpi - Sd1 * api;
-    const double excess = 2.0 * area - api * dpi;
-    const double newDy = std::min(Sd1 / den * excess, dpi);
-    const double newAy = std::min(Sa1 / den * excess, api);
-    if (!(newDy > 0.0) || !(newAy > 0.0)) return 0;
-    dy = newDy;
-    ay = newAy;
-    return 1;
-}
-
-int CPushOverCalcPerfPtBase::GetCapacityAccelAt(double d, double& Sa) const
-{
-    const T_ADRS_CURVE& c = Capacity();
-    for (std::size_t i = 0; i + 1 < c.Sd.size(); ++i) {
-        if (!(c.Sd[i] <= d && d < c.Sd[i + 1])) continue;
-        Sa = c.Sa[i] + (c.Sa[i + 1] - c.Sa[i]) * (d - c.Sd[i]) / (c.Sd[i + 1] - c.Sd[i]);
-        return 1;
-    }
-    return 0;
-}
-
 int CPushOverCalcPerfPtBase::IntersectSegmentWithCapacity(T_POINT2 P1, T_POINT2 P2,
                                                           T_POINT2& point) const
 {
@@ -186,68 +81,32 @@ int CPushOverCalcPerfPtBase::CalcSpectralReductionFactors(double dy, double ay, 
                                                           double api, double& SRa, double& SRv,
                                                           double& betaEff)
 {
-    double fraction = (ay * dpi - dy * api) / (api * dpi);
-    double beta0 = kFullLoopPct * fraction;
-    if (beta0 > kMaxBeta0) {
-        beta0 = kMaxBeta0;
-        fraction = kMaxBeta0 / kFullLoopPct;
-    }
-    const T_DAMP_PARAM& damping = m_owner.Damping();
-    const double kappa = GetDampingModificationFactor(damping.behaviorType, beta0, fraction);
-    const double beta = kappa * beta0 + damping.elasticPct;
-    m_last.kappa = kappa;
-    if (beta < 0.0) {
-        Assert(__LINE__);
-        return 0;
-    }
-    T_SPEC_REDUCTION f;
-    if (!CalcSpectralReduction(beta, f)) return 0;
-    SRa = f.SRa;
-    SRv = f.SRv;
-    betaEff = beta;
+    T_PERFPT_REDUCTION r;
+    const int done = m_operations.CalcReduction(dy, ay, dpi, api, r);
+    m_last.kappa = r.kappa;
+    if (!done) return 0;
+    SRa = r.factors.SRa;
+    SRv = r.factors.SRv;
+    betaEff = r.betaEff;
     return 1;
-}
-
-double CPushOverCalcPerfPtBase::GetDampingModificationFactor(int type, double& beta0,
-                                                             double fraction) const
-{
-    for (const T_KAPPA_ROW& row : kKappa) {
-        if (row.type == type) return beta0 <= row.kneePct ? row.flat : row.k0 - row.k1 * fraction;
-    }
-    if (type != 3) return 0.0;
-    const T_DAMP_PARAM& user = m_owner.Damping();
-    if (beta0 <= user.beta1) return user.kappa1;
-    if (beta0 > user.beta2) {
-        beta0 = user.beta2; // the damping itself is limited too
-        return user.kappa2;
-    }
-    return user.kappa1 +
-           (user.kappa2 - user.kappa1) * (beta0 - user.beta1) / (user.beta2 - user.beta1);
-}
-
-bool CPushOverCalcPerfPtBase::IsElasticDamping(double beta) const
-{
-    return m_owner.Damping().elasticPct > beta || std::fabs(beta - 5.0) < 0.001;
 }
 
 int CPushOverCalcPerfPtBase::CalcFema440EffectivePeriod(double T0, double mu, double alpha,
                                                         int range, double& Teff)
 {
-    const double key = m_owner.AlphaInPercent() ? 100.0 * alpha : alpha;
-    const int row = Fema440RowIndex(m_owner.Damping().behaviorType, key);
+    const int row = m_operations.CoefficientRow(alpha);
     m_last.row = row;
     if (CalcFema440Period(Fema440Row(row), range, T0, mu, Teff)) return 1;
-    Assert(__LINE__);
+    ReleaseAssert(kSource, __LINE__);
     return 0;
 }
 
 int CPushOverCalcPerfPtBase::CalcFema440EffectiveDamping(double T0, double Teff, double mu,
                                                          double alpha, int range, double& betaPct)
 {
-    const double key = m_owner.AlphaInPercent() ? 100.0 * alpha : alpha;
-    const int row = Fema440RowIndex(m_owner.Damping().behaviorType, key);
+    const int row = m_operations.CoefficientRow(alpha);
     if (CalcFema440Damping(Fema440Row(row), range, T0, Teff, mu, betaPct)) return 1;
-    Assert(__LINE__);
+    ReleaseAssert(kSource, __LINE__);
     return 0;
 }
 
@@ -295,9 +154,4 @@ int CPushOverCalcPerfPtBase::End(PUSH_OUTCOME code, int result, int count)
 {
     m_outcome = {code, count};
     return result;
-}
-
-double CPushOverCalcPerfPtBase::PeriodOf(double Sd, double Sa) const
-{
-    return 2.0 * m_pi * std::sqrt(Sd / (Sa * m_owner.GetGravity(1)));
 }

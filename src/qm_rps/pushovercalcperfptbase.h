@@ -1,4 +1,4 @@
-// Base of the performance-point calculators: geometry and damping of the capacity spectrum method.
+// Base of the performance-point calculators of the capacity spectrum method.
 // ATC-40 (1996) chapter 8; FEMA 440 (2005) chapter 6.
 //
 // A calculator serves one evaluation: it reads its owner's capacity and demand spectra and damping
@@ -7,7 +7,7 @@
 // Units: Sd in the model's length, Sa in g, periods in s, damping in per cent.
 #pragma once
 
-#include "qm_rps/pushover/pushoverperfptrecord.h"
+#include "qm_rps/pushover/perfptoperations.h"
 
 /// Result codes of CalcPerformancePoint and IteratePerformancePoint.
 inline constexpr int kPerfPtNone = 0;
@@ -41,37 +41,36 @@ public:
     [[nodiscard]] virtual int FindInitialTrialPoint(double D1, double A1, double& dpi, double& api,
                                                     double& Dd, double& Ad);
 
-    /// First capacity point where the slope, relative to the segment before, changes by more than
-    /// 0.1. 0 none: the point examined last, or (0, 0) where the curve starts at the origin.
-    [[nodiscard]] virtual int FindFirstSlopeChange(double& D, double& A);
-
-    /// Area under the capacity spectrum from its first stored point to d.
-    [[nodiscard]] virtual int CalcCapacityArea(double d, double& area);
-
-    /// SRa, SRv and effective damping of a bilinear representation. ATC-40 (8-5) to (8-10), without
-    /// lower bounds (those belong to the spectrum).
+    // Geometry and damping of the capacity spectrum: see CPerfPtOperations.
+    [[nodiscard]] virtual int FindFirstSlopeChange(double& D, double& A)
+    {
+        return m_operations.FindFirstSlopeChange(D, A);
+    }
+    [[nodiscard]] virtual int CalcCapacityArea(double d, double& area)
+    {
+        return m_operations.CalcCapacityArea(d, area);
+    }
+    [[nodiscard]] virtual int BilinearizeAt(double dpi, double api, double& dy, double& ay)
+    {
+        return m_operations.BilinearizeAt(dpi, api, dy, ay);
+    }
+    [[nodiscard]] virtual int GetCapacityAccelAt(double d, double& Sa) const
+    {
+        return m_operations.GetCapacityAccelAt(d, Sa);
+    }
+    virtual double GetDampingModificationFactor(int type, double& beta0, double fraction) const
+    {
+        return m_operations.GetDampingModificationFactor(type, beta0, fraction);
+    }
+    virtual bool IsElasticDamping(double beta) const { return m_operations.IsElasticDamping(beta); }
+    /// CPerfPtOperations::CalcReduction; kappa is kept for the trace.
     [[nodiscard]] virtual int CalcSpectralReductionFactors(double dy, double ay, double dpi,
                                                            double api, double& SRa, double& SRv,
                                                            double& betaEff);
 
-    /// kappa of ATC-40 Table 8-1 for type 0 (A), 1 (B), 2 (C), or from the user's points for
-    /// type 3, which may limit beta0 to beta2; 0 for other types. `fraction` is beta0 / 63.7.
-    virtual double GetDampingModificationFactor(int type, double& beta0, double fraction) const;
-
-    /// Sa of the capacity spectrum at d. 0 beyond the curve, the last point included.
-    [[nodiscard]] virtual int GetCapacityAccelAt(double d, double& Sa) const;
-
-    /// Yield point of the bilinear curve of equal area through (dpi, api), anchored at the initial
-    /// stiffness. ATC-40 8.2.2.1.1.
-    [[nodiscard]] virtual int BilinearizeAt(double dpi, double api, double& dy, double& ay);
-
     /// First crossing of the segment P1-P2 with the capacity spectrum.
     [[nodiscard]] virtual int IntersectSegmentWithCapacity(T_POINT2 P1, T_POINT2 P2,
                                                            T_POINT2& point) const;
-
-    /// True below the elastic damping setting, or within 0.001 of the constant 5 (not of the
-    /// setting, on purpose).
-    virtual bool IsElasticDamping(double beta) const;
 
     /// First crossing of the half line of period T with a curve; (0, 0) where there is none.
     [[nodiscard]] virtual int IntersectPeriodLineWithCurve(const std::vector<double>& Sd,
@@ -110,12 +109,11 @@ protected:
     int End(PUSH_OUTCOME code, int result, int count = 0);
 
     const T_ADRS_CURVE& Capacity() const { return m_owner.Capacity(); }
-    /// T = 2 pi sqrt(Sd / (Sa g)).
-    double PeriodOf(double Sd, double Sa) const;
+    double PeriodOf(double Sd, double Sa) const { return m_operations.PeriodOf(Sd, Sa); }
 
     CPushOverPerfPtRecord& m_owner;
+    CPerfPtOperations m_operations;
     int m_iteration = 0;
-    double m_pi;
     std::vector<T_PERFPT_TRIAL> m_trace;
     T_OUTCOME m_outcome;
     T_PERFPT_TRIAL m_last; // values of the trial being computed that helpers fill in

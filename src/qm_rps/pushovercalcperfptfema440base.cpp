@@ -1,6 +1,6 @@
 #include "qm_rps/pushovercalcperfptfema440base.h"
 
-#include "qm_base/appbase.h"
+#include "qm_rps/pushover/releaseassert.h"
 
 #include <cmath>
 
@@ -37,7 +37,7 @@ int CPushOverCalcPerfPtFEMA440Base::GetCapacityPointAtDisplacement2(double d, do
 
 void CPushOverCalcPerfPtFEMA440Base::Assert(int line) const
 {
-    if (CAppBase::IsReleaseAssert_ST()) CAppBase::ReleaseAssertion_ST(m_source, line);
+    ReleaseAssert(m_source, line);
 }
 
 void CPushOverCalcPerfPtFEMA440Base::WarnAnyType(double T0) const

@@ -1,15 +1,14 @@
 #include "qm_rps/pushovercalcperfptfema440proca.h"
 
-#include "qm_rps/pushover/fema440coefficients.h"
-
 #include "qm_base/debugout.h"
+#include "qm_rps/pushover/adrsformulas.h"
+#include "qm_rps/pushover/fema440coefficients.h"
 
 #include <cmath>
 
 namespace {
 
-constexpr double kAccept = 0.05;     // the trial stands when within 5 %
-constexpr double kSameAccel = 1e-12; // g; api this close to ay: no post-yield stiffness
+constexpr double kAccept = 0.05; // the trial stands when within 5 %
 
 } // namespace
 
@@ -57,7 +56,7 @@ int CPushOverCalcPerfPtFEMA440ProcA::CalcDuctility(double dpi, double api, doubl
     m_log.ay = ay;
     if (std::fabs(dy) < 1e-30) return Fail(PUSH_OUTCOME::BilinearFailed);
     m_log.mu = dpi / dy;
-    alpha = std::fabs(api - ay) > kSameAccel ? ((api - ay) / (dpi - dy)) / (ay / dy) : 0.0;
+    alpha = PostYieldRatio(dy, ay, dpi, api);
     if (!std::isfinite(alpha) || !std::isfinite(m_log.mu))
         return Fail(PUSH_OUTCOME::BilinearFailed);
     m_trace.back().alpha = alpha;

@@ -1,5 +1,6 @@
 #include "qm_rps/pushovercalcperfptfema440procc.h"
 
+#include "qm_rps/pushover/adrsformulas.h"
 #include "qm_rps/pushover/fema440coefficients.h"
 
 #include <cmath>
@@ -7,8 +8,7 @@
 namespace {
 
 constexpr int kKindC = 2;
-constexpr double kElasticMu = 0.05;  // ductility this close to 1: elastic
-constexpr double kSameAccel = 1e-12; // g
+constexpr double kElasticMu = 0.05; // ductility this close to 1: elastic
 
 } // namespace
 
@@ -25,8 +25,7 @@ int CPushOverCalcPerfPtFEMA440ProcC::CalcYield(double dpi, double api)
         Assert(87);
         return Fail(PUSH_OUTCOME::BilinearFailed);
     }
-    m_alpha =
-        std::fabs(api - m_ay) > kSameAccel ? ((api - m_ay) / (dpi - m_dy)) / (m_ay / m_dy) : 0.0;
+    m_alpha = PostYieldRatio(m_dy, m_ay, dpi, api);
     m_mu0 = dpi / m_dy;
     if (!std::isfinite(m_alpha) || !std::isfinite(m_mu0)) return Fail(PUSH_OUTCOME::BilinearFailed);
     return 1;

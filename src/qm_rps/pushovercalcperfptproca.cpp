@@ -1,7 +1,7 @@
 #include "qm_rps/pushovercalcperfptproca.h"
 
-#include "qm_base/appbase.h"
 #include "qm_base/debugout.h"
+#include "qm_rps/pushover/releaseassert.h"
 
 #include <cmath>
 
@@ -18,8 +18,7 @@ int CPushOverCalcPerfPtProcA::CalcTrial(double dpi, double api, double& Di, doub
     T_PERFPT_TRIAL& row = m_trace.back();
     double dy = 0.0, ay = 0.0;
     if (!BilinearizeAt(dpi, api, dy, ay)) {
-        if (CAppBase::IsReleaseAssert_ST())
-            CAppBase::ReleaseAssertion_ST("src/qm_rps/pushovercalcperfptproca", 70);
+        ReleaseAssert("src/qm_rps/pushovercalcperfptproca", 70);
         return End(PUSH_OUTCOME::BilinearFailed, 0);
     }
     row.dy = dy;

@@ -1,6 +1,6 @@
 #include "qm_rps/pushovercalcperfptprocb.h"
 
-#include "qm_base/appbase.h"
+#include "qm_rps/pushover/releaseassert.h"
 
 #include <algorithm>
 #include <array>
@@ -13,8 +13,7 @@ constexpr std::array<double, 4> kSampledMu{2.0, 4.0, 6.0, 8.0};
 
 void Assert(int line)
 {
-    if (CAppBase::IsReleaseAssert_ST())
-        CAppBase::ReleaseAssertion_ST("src/qm_rps/pushovercalcperfptprocb", line);
+    ReleaseAssert("src/qm_rps/pushovercalcperfptprocb", line);
 }
 
 } // namespace

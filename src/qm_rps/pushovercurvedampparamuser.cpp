@@ -1,5 +1,7 @@
 #include "qm_rps/pushovercurvedampparamuser.h"
 
+#include "qm_rps/pushover/adrsformulas.h"
+
 #include <algorithm>
 #include <cmath>
 
@@ -21,7 +23,6 @@ void CPushOverCurveDampParamUser::Dlg2Data(T_DAMP_PARAM& damping) const
 
 std::vector<T_POINT2> CPushOverCurveDampParamUser::Curve() const
 {
-    constexpr double kFullLoopPct = 63.7;
     return {{0.0, m_kappa1},
             {m_beta1, m_kappa1},
             {m_beta2, m_kappa2},

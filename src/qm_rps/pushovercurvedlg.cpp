@@ -4,6 +4,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_db/filectrl.h"
+#include "qm_rps/pushover/adrsformulas.h"
 #include "qm_rps/pushover/pushoverallpoints.h"
 #include "qm_rps/pushover/pushovercells.h"
 #include "qm_rps/pushovercalcperfptfema440proca.h"
@@ -237,7 +238,7 @@ T_PERF_POINT CPushOverCurveDlg::MakePoint(double Dp, double Ap, std::optional<do
     p.Sd = p.D = Dp;
     p.Sa = p.V = Ap;
     TransferToDispAndReac(&p.D, &p.V);
-    p.Teff = 2.0 * std::acos(-1.0) * std::sqrt(Dp / (Ap * GetGravity(1)));
+    p.Teff = SecantPeriod(Dp, Ap, GetGravity(1));
     p.damping = beta;
     return p;
 }

@@ -1,9 +1,10 @@
 #include "qm_rps/pushover/curvecrossing.h"
 
+#include "qm_rps/pushover/adrsformulas.h"
+
 #include <algorithm>
 #include <cmath>
 #include <limits>
-#include <numbers>
 #include <utility>
 
 namespace {
@@ -162,7 +163,7 @@ std::optional<T_POINT2> CCurveCrossing::HalfLine(T_POINT2 toward, const T_ADRS_V
 std::optional<T_POINT2> CCurveCrossing::PeriodLine(double T, double gravity,
                                                    const T_ADRS_VIEW& curve)
 {
-    const double slope = 4.0 * std::numbers::pi * std::numbers::pi / (T * T * gravity);
+    const double slope = RadialSlope(T, gravity);
     if (!std::isfinite(slope)) return std::nullopt;
     return HalfLine({1.0, slope}, curve);
 }

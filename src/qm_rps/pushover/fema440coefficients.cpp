@@ -8,29 +8,52 @@ namespace {
 constexpr double kAny = std::numeric_limits<double>::infinity();
 
 struct T_ROW {
-    int type;        // hysteresis model
-    double maxAlpha; // last alpha of the row
-    bool atMost;     // false: the row is for alpha below maxAlpha, not at it
-    const char* text;
-    T_FEMA440_ROW c;
+    int type;         // hysteresis model
+    double maxAlpha;  // last alpha of the row
+    bool atMost;      // false: the row is for alpha below maxAlpha, not at it
+    const char* text; // the row's alpha in words; empty: any
 };
 
-// FEMA 440 Table 6-1 (damping A to F) and Table 6-2 (period G to L).
+/// Hysteresis models by their number.
+constexpr std::array<const char*, 4> kModels{"bilinear", "stiffness degrading",
+                                             "strength degrading", "any type"};
+
+constexpr std::size_t kRowCount = 13;
+
+// Rows of FEMA 440 Tables 6-1 and 6-2.
 // clang-format off
-constexpr std::array<T_ROW, 13> kRows{{
-    {0, 0.0,  true,  "bilinear, alpha <= 0",             {{0.11, -0.017, 0.27, 0.090, 0.57,  0.00}, {3.2, -0.66, 11.0, 0.12, 19.0, 0.73}}},
-    {0, 2.0,  true,  "bilinear, alpha <= 2",             {{0.10, -0.014, 0.17, 0.120, 0.67,  0.02}, {3.3, -0.64,  9.4, 1.10, 19.0, 0.42}}},
-    {0, 5.0,  true,  "bilinear, alpha <= 5",             {{0.11, -0.018, 0.09, 0.140, 0.77,  0.05}, {4.2, -0.83, 10.0, 1.60, 22.0, 0.40}}},
-    {0, 10.0, true,  "bilinear, alpha <= 10",            {{0.13, -0.022, 0.27, 0.100, 0.87,  0.10}, {5.1, -1.10, 12.0, 1.60, 24.0, 0.36}}},
-    {0, kAny, true,  "bilinear, alpha > 10",             {{0.10, -0.015, 0.17, 0.094, 0.98,  0.20}, {4.6, -0.99, 12.0, 1.10, 25.0, 0.37}}},
-    {1, 0.0,  true,  "stiffness degrading, alpha <= 0",  {{0.17, -0.032, 0.10, 0.190, 0.85,  0.00}, {5.1, -1.10, 12.0, 1.40, 20.0, 0.62}}},
-    {1, 2.0,  true,  "stiffness degrading, alpha <= 2",  {{0.18, -0.034, 0.22, 0.160, 0.88,  0.02}, {5.3, -1.20, 11.0, 1.60, 20.0, 0.51}}},
-    {1, 5.0,  true,  "stiffness degrading, alpha <= 5",  {{0.18, -0.037, 0.15, 0.160, 0.92,  0.05}, {5.6, -1.30, 10.0, 1.80, 20.0, 0.38}}},
-    {1, 10.0, true,  "stiffness degrading, alpha <= 10", {{0.17, -0.034, 0.26, 0.120, 0.97,  0.10}, {5.3, -1.20,  9.2, 1.90, 21.0, 0.37}}},
-    {1, kAny, true,  "stiffness degrading, alpha > 10",  {{0.13, -0.027, 0.11, 0.110, 1.00,  0.20}, {4.6, -1.00,  9.6, 1.30, 23.0, 0.34}}},
-    {2, -3.0, false, "strength degrading, alpha < -3",   {{0.20, -0.038, 0.25, 0.170, 0.71, -0.05}, {5.6, -1.30, 14.0, 0.61, 22.0, 0.90}}},
-    {2, kAny, true,  "strength degrading, alpha >= -3",  {{0.18, -0.033, 0.17, 0.180, 0.76, -0.03}, {5.3, -1.20, 14.0, 0.69, 24.0, 0.90}}},
-    {3, kAny, true,  "any type",                         {{0.20, -0.038, 0.28, 0.130, 0.89,  0.05}, {4.9, -1.10, 14.0, 0.32, 19.0, 0.64}}},
+constexpr std::array<T_ROW, kRowCount> kRows{{
+    {0, 0.0,  true,  "<= 0"},
+    {0, 2.0,  true,  "<= 2"},
+    {0, 5.0,  true,  "<= 5"},
+    {0, 10.0, true,  "<= 10"},
+    {0, kAny, true,  "> 10"},
+    {1, 0.0,  true,  "<= 0"},
+    {1, 2.0,  true,  "<= 2"},
+    {1, 5.0,  true,  "<= 5"},
+    {1, 10.0, true,  "<= 10"},
+    {1, kAny, true,  "> 10"},
+    {2, -3.0, false, "< -3"},
+    {2, kAny, true,  ">= -3"},
+    {3, kAny, true,  ""},
+}};
+
+// The same rows of Table 6-2 (period G to L) and of Table 6-1 (damping A to F).
+// Behind each: its model and alpha.
+constexpr std::array<T_FEMA440_ROW, kRowCount> kCoefficients{{
+    {{0.11, -0.017, 0.27, 0.090, 0.57,  0.00}, {3.2, -0.66, 11.0, 0.12, 19.0, 0.73}}, // 0, <= 0
+    {{0.10, -0.014, 0.17, 0.120, 0.67,  0.02}, {3.3, -0.64,  9.4, 1.10, 19.0, 0.42}}, // 0, <= 2
+    {{0.11, -0.018, 0.09, 0.140, 0.77,  0.05}, {4.2, -0.83, 10.0, 1.60, 22.0, 0.40}}, // 0, <= 5
+    {{0.13, -0.022, 0.27, 0.100, 0.87,  0.10}, {5.1, -1.10, 12.0, 1.60, 24.0, 0.36}}, // 0, <= 10
+    {{0.10, -0.015, 0.17, 0.094, 0.98,  0.20}, {4.6, -0.99, 12.0, 1.10, 25.0, 0.37}}, // 0, > 10
+    {{0.17, -0.032, 0.10, 0.190, 0.85,  0.00}, {5.1, -1.10, 12.0, 1.40, 20.0, 0.62}}, // 1, <= 0
+    {{0.18, -0.034, 0.22, 0.160, 0.88,  0.02}, {5.3, -1.20, 11.0, 1.60, 20.0, 0.51}}, // 1, <= 2
+    {{0.18, -0.037, 0.15, 0.160, 0.92,  0.05}, {5.6, -1.30, 10.0, 1.80, 20.0, 0.38}}, // 1, <= 5
+    {{0.17, -0.034, 0.26, 0.120, 0.97,  0.10}, {5.3, -1.20,  9.2, 1.90, 21.0, 0.37}}, // 1, <= 10
+    {{0.13, -0.027, 0.11, 0.110, 1.00,  0.20}, {4.6, -1.00,  9.6, 1.30, 23.0, 0.34}}, // 1, > 10
+    {{0.20, -0.038, 0.25, 0.170, 0.71, -0.05}, {5.6, -1.30, 14.0, 0.61, 22.0, 0.90}}, // 2, < -3
+    {{0.18, -0.033, 0.17, 0.180, 0.76, -0.03}, {5.3, -1.20, 14.0, 0.69, 24.0, 0.90}}, // 2, >= -3
+    {{0.20, -0.038, 0.28, 0.130, 0.89,  0.05}, {4.9, -1.10, 14.0, 0.32, 19.0, 0.64}}, // 3
 }};
 // clang-format on
 
@@ -56,12 +79,14 @@ int Fema440RowIndex(int type, double alpha)
 
 const T_FEMA440_ROW& Fema440Row(int index)
 {
-    return kRows[static_cast<std::size_t>(index)].c;
+    return kCoefficients[static_cast<std::size_t>(index)];
 }
 
 std::string Fema440RowText(int index)
 {
-    return kRows[static_cast<std::size_t>(index)].text;
+    const T_ROW& row = kRows[static_cast<std::size_t>(index)];
+    const std::string model = kModels[static_cast<std::size_t>(row.type)];
+    return *row.text ? model + ", alpha " + row.text : model;
 }
 
 int Fema440DuctilityRange(double mu)

@@ -1,11 +1,11 @@
 #include "qm_rps/pushover/pushoverallpoints.h"
 
+#include "qm_rps/pushover/adrsformulas.h"
 #include "qm_rps/pushover/fema440coefficients.h"
 #include "qm_rps/pushover/fema440workingspectrum.h"
 
 #include <algorithm>
 #include <cmath>
-#include <numbers>
 
 namespace {
 
@@ -14,11 +14,6 @@ constexpr double kBalanced = 1e-7; // what is left of demand / capacity - 1 at a
 constexpr int kMaxHalvings = 80;
 constexpr std::size_t kSamples = 2000; // along the whole curve
 
-double Period(double Sd, double Sa, double g)
-{
-    return 2.0 * std::numbers::pi * std::sqrt(Sd / (Sa * g));
-}
-
 T_POINT2 Between(const T_POINT2& a, const T_POINT2& b)
 {
     return {0.5 * (a.x + b.x), 0.5 * (a.y + b.y)};
@@ -26,7 +21,7 @@ T_POINT2 Between(const T_POINT2& a, const T_POINT2& b)
 
 } // namespace
 
-CPushOverAllPoints::CPushOverAllPoints(CPushOverPerfPtRecord& owner, bool fema440)
+CPushOverAllPoints::CPushOverAllPoints(const CPushOverPerfPtRecord& owner, bool fema440)
     : m_owner(owner), m_operations(owner), m_fema440(fema440)
 {
 }
@@ -38,38 +33,34 @@ std::optional<double> CPushOverAllPoints::DemandSd(double T, F&& ordinate) const
     const auto it = std::ranges::upper_bound(grid, T);
     if (!(T >= grid.front()) || it == grid.end()) return std::nullopt;
     const auto k = static_cast<std::size_t>(it - grid.begin());
-    const double g = m_owner.GetGravity(1), c = g / (4.0 * std::numbers::pi * std::numbers::pi);
-    const double Sa0 = ordinate(k - 1), Sa1 = ordinate(k);
-    const std::array<double, 2> Sd{grid[k - 1] * grid[k - 1] * Sa0 * c,
-                                   grid[k] * grid[k] * Sa1 * c};
-    const std::array<double, 2> Sa{Sa0, Sa1};
+    const double g = m_owner.GetGravity(1);
+    const std::array<double, 2> Sa{ordinate(k - 1), ordinate(k)};
+    const std::array<double, 2> Sd{SpectralDisplacement(grid[k - 1], Sa[0], g),
+                                   SpectralDisplacement(grid[k], Sa[1], g)};
     const auto point = CCurveCrossing::PeriodLine(T, g, {Sd, Sa});
     return point ? std::optional(point->x) : std::nullopt;
 }
 
 std::optional<CPushOverAllPoints::T_BALANCE> CPushOverAllPoints::AtAtc40(const T_POINT2& p,
-                                                                         double dy, double ay)
+                                                                         double dy, double ay) const
 {
-    T_BALANCE b;
-    double SRa = 0.0, SRv = 0.0;
-    if (!m_operations.CalcSpectralReductionFactors(dy, ay, p.x, p.y, SRa, SRv, b.betaEff))
-        return std::nullopt;
+    T_PERFPT_REDUCTION r;
+    if (!m_operations.CalcReduction(dy, ay, p.x, p.y, r)) return std::nullopt;
     const CETC_DESIGN_SPECT& spectrum = *m_owner.DesignSpectrum();
-    const auto Sd = DemandSd(Period(p.x, p.y, m_owner.GetGravity(1)),
-                             [&](std::size_t i) { return spectrum.CalcPOOrdinate(SRa, SRv, i); });
+    const auto Sd = DemandSd(m_operations.PeriodOf(p.x, p.y), [&](std::size_t i) {
+        return spectrum.CalcPOOrdinate(r.factors.SRa, r.factors.SRv, i);
+    });
     if (!Sd) return std::nullopt;
-    b.ratio = *Sd / p.x - 1.0;
-    return b;
+    return T_BALANCE{*Sd / p.x - 1.0, r.betaEff};
 }
 
 std::optional<CPushOverAllPoints::T_BALANCE>
 CPushOverAllPoints::AtFema440(const T_POINT2& p, double dy, double ay) const
 {
     const double mu = p.x / dy;
-    const double alpha = std::fabs(p.y - ay) > 1e-12 ? ((p.y - ay) / (p.x - dy)) / (ay / dy) : 0.0;
+    const double alpha = PostYieldRatio(dy, ay, p.x, p.y);
     if (!(mu >= 1.0) || !std::isfinite(alpha)) return std::nullopt;
-    const double key = m_owner.AlphaInPercent() ? 100.0 * alpha : alpha;
-    const T_FEMA440_ROW& row = Fema440Row(Fema440RowIndex(m_owner.Damping().behaviorType, key));
+    const T_FEMA440_ROW& row = Fema440Row(m_operations.CoefficientRow(alpha));
     const int range = Fema440DuctilityRange(mu);
     T_BALANCE b;
     double Teff = 0.0, B = 0.0;
@@ -82,7 +73,7 @@ CPushOverAllPoints::AtFema440(const T_POINT2& p, double dy, double ay) const
     return b;
 }
 
-std::optional<CPushOverAllPoints::T_BALANCE> CPushOverAllPoints::At(const T_POINT2& p)
+std::optional<CPushOverAllPoints::T_BALANCE> CPushOverAllPoints::At(const T_POINT2& p) const
 {
     double dy = 0.0, ay = 0.0;
     if (!(p.x > 0.0) || !(p.y > 0.0) || !m_operations.BilinearizeAt(p.x, p.y, dy, ay))
@@ -92,7 +83,7 @@ std::optional<CPushOverAllPoints::T_BALANCE> CPushOverAllPoints::At(const T_POIN
 }
 
 void CPushOverAllPoints::Refine(const T_POINT2& from, double ratioFrom, const T_POINT2& to,
-                                std::vector<T_BALANCED_POINT>& out)
+                                std::vector<T_BALANCED_POINT>& out) const
 {
     T_POINT2 a = from, b = to;
     for (int i = 0; i < kMaxHalvings && std::fabs(b.x - a.x) > 0.1 * kPrecise * std::fabs(b.x);
@@ -118,7 +109,7 @@ std::vector<T_BALANCED_POINT> CPushOverAllPoints::Find()
     std::vector<T_BALANCED_POINT> points;
     const T_ADRS_VIEW curve = m_owner.Capacity().View();
     if (!m_owner.DesignSpectrum() || curve.Size() < 2) return points;
-    m_T0 = Period(curve.Sd[1], curve.Sa[1], m_owner.GetGravity(1));
+    m_T0 = m_operations.PeriodOf(curve.Sd[1], curve.Sa[1]);
     std::optional<T_BALANCE> before;
     T_POINT2 last;
     const auto visit = [&](const T_POINT2& p) {

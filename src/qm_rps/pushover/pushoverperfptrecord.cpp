@@ -1,6 +1,7 @@
 #include "qm_rps/pushover/pushoverperfptrecord.h"
 
-#include <numbers>
+#include "qm_rps/pushover/adrsformulas.h"
+
 #include <utility>
 
 int CPushOverPerfPtRecord::PerfPt_GetCrossPointDiAi(const std::vector<double>& Sd,
@@ -45,10 +46,9 @@ void CPushOverPerfPtRecord::SetDesignSpectrum(std::unique_ptr<CETC_DESIGN_SPECT>
 void CPushOverPerfPtRecord::ToAdrs(const std::vector<double>& T, const std::vector<double>& Sa,
                                    std::vector<double>& Sd) const
 {
-    const double factor = m_gravity / (4.0 * std::numbers::pi * std::numbers::pi);
     Sd.resize(T.size());
     for (std::size_t i = 0; i < T.size(); ++i)
-        Sd[i] = T[i] * T[i] * Sa[i] * factor;
+        Sd[i] = SpectralDisplacement(T[i], Sa[i], m_gravity);
 }
 
 void CPushOverPerfPtRecord::ClearPerfPoint()

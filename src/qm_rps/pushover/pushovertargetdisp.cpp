@@ -1,6 +1,7 @@
 #include "qm_rps/pushover/pushovertargetdisp.h"
 
 #include "qm_db/compfunc.h"
+#include "qm_rps/pushover/adrsformulas.h"
 
 #include <cmath>
 #include <numbers>
@@ -43,7 +44,7 @@ T_TARGET_DISP CalcTargetDisp(const T_BILINEAR& bilinear, double gravity, double 
     t.Se = Se;
     t.Tc = Tc;
     if (!(t.ay > 0.0)) return None(t, PUSH_OUTCOME::BilinearTooShort);
-    t.Tstar = 2.0 * std::numbers::pi * std::sqrt(t.dy / (t.ay * gravity));
+    t.Tstar = SecantPeriod(t.dy, t.ay, gravity);
     t.det = Se * gravity * PeriodFactor(t.Tstar);
     if (!std::isfinite(t.Tstar) || !std::isfinite(t.det)) return None(t, PUSH_OUTCOME::NoTarget);
     if (t.Tstar >= Tc) {

@@ -1,8 +1,9 @@
 #include "qm_rps/pushover/pushovertargetevaluation.h"
 
+#include "qm_rps/pushover/adrsformulas.h"
+
 #include <algorithm>
 #include <cmath>
-#include <numbers>
 
 namespace {
 
@@ -40,7 +41,7 @@ T_TARGET_DISP CPushOverTargetEvaluation::CalcTarget(const T_TARGET_SPECTRUM& spe
                                                     bool capAt3) const
 {
     T_BILINEAR b = *m_bilinear;
-    const double T = 2.0 * std::numbers::pi * std::sqrt(b.dy / (b.ay * m_in.gravity));
+    const double T = SecantPeriod(b.dy, b.ay, m_in.gravity);
     T_TARGET_DISP t = CalcTargetDisp(b, m_in.gravity, spectrum.SaAt(T), spectrum.Tc, capAt3);
     t.mStar = m_in.mStar;
     t.Fy = b.ay * m_in.gravity * m_in.mStar;

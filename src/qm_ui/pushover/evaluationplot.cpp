@@ -2,6 +2,7 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/pushover/adrsformulas.h"
 #include "qm_ui/pushover/adrscurve.h"
 
 #include <algorithm>
@@ -57,7 +58,7 @@ void AddRadial(T_PLOT& plot, const char* what, double T, double gravity)
     if (!(T > 0.0) || !std::isfinite(T)) return;
     T_PLOT_GUIDE g;
     g.kind = PLOT_GUIDE::Radial;
-    g.value = 4.0 * std::acos(-1.0) * std::acos(-1.0) / (T * T * gravity);
+    g.value = RadialSlope(T, gravity);
     g.label = FormatText("%s = %.3g s", what, T);
     g.line = PLOT_LINE::Dot;
     plot.guides.push_back(std::move(g));
@@ -66,8 +67,7 @@ void AddRadial(T_PLOT& plot, const char* what, double T, double gravity)
 double PeriodOfFirstStep(const T_PUSH_EVALUATION& e)
 {
     if (e.capacity.Sd.size() < 2 || !(e.capacity.Sa[1] > 0.0)) return 0.0;
-    return 2.0 * std::acos(-1.0) *
-           std::sqrt(e.capacity.Sd[1] / (e.capacity.Sa[1] * e.factors.gravity));
+    return SecantPeriod(e.capacity.Sd[1], e.capacity.Sa[1], e.factors.gravity);
 }
 
 /// Trial points, numbered where they are few.
