@@ -4,6 +4,7 @@
 #include "inputfile.h"
 #include "output.h"
 #include "qm_base/textformat.h"
+#include "json/analysisjson.h"
 
 #ifdef QM_UI
 #include "modelshape.h"

@@ -5,9 +5,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <functional>
-#include <nlohmann/json.hpp>
-#include <utility>
 
 namespace {
 
@@ -41,67 +38,6 @@ std::vector<std::string> Dofs(const char* a, const std::string& unitA, const cha
         for (const char* axis : {"X", "Y", "Z"})
             out.push_back(std::string(prefix) + axis + " (" + (prefix == a ? unitA : unitB) + ")");
     return out;
-}
-
-std::string NumberList(const T_DOF6& values)
-{
-    std::string text = "[";
-    for (std::size_t i = 0; i < values.size(); ++i)
-        text += (i ? ", " : "") + ShortestText(values[i]);
-    return text + "]";
-}
-
-/// {"ID": value, ...}, one to a line.
-template <class T, class F>
-std::string IdObject(const std::vector<T_BY_ID<T>>& rows, const F& print)
-{
-    std::string text = "{";
-    const char* before = "\n   \"";
-    for (const T_BY_ID<T>& row : rows) {
-        text += before + std::to_string(row.id) + "\": " + print(row.value);
-        before = ",\n   \"";
-    }
-    return text + (rows.empty() ? "}" : "\n  }");
-}
-
-/// "name": {CASE: {ID: value}}.
-template <class T, class F>
-std::string CaseObject(const char* name, const std::vector<T_SHOWN_CASE>& shown,
-                       const std::vector<T_CASE_RESULTS>& results,
-                       std::vector<T_BY_ID<T>> T_CASE_RESULTS::*rows, const F& print)
-{
-    std::string text = std::string(" \"") + name + "\": {";
-    for (std::size_t i = 0; i < shown.size(); ++i)
-        text += (i ? ",\n  " : "\n  ") + JsonText(shown[i].name) + ": " +
-                IdObject(results[i].*rows, print);
-    return text + (shown.empty() ? "}" : "\n }");
-}
-
-std::string BeamList(const T_BEAM_ROWS& rows)
-{
-    std::string text = "[";
-    for (std::size_t p = 0; p < rows.size(); ++p)
-        text += (p ? ", " : "") + NumberList(rows[p]);
-    return text + "]";
-}
-
-std::string StageObject(const T_SHOWN_STAGE& s)
-{
-    const T_CASE_RESULTS& r = s.results;
-    return FormatText("{\n  \"step\": %d, \"load\": ", s.choice.step) + JsonText(s.load) +
-           FormatText(", \"elements\": %zu,\n  \"displacements\": ", s.elements) +
-           IdObject(r.displacements, NumberList) +
-           ",\n  \"reactions\": " + IdObject(r.reactions, NumberList) +
-           ",\n  \"truss\": " + IdObject(r.trusses, ShortestText) +
-           ",\n  \"beam\": " + IdObject(r.beams, BeamList) + "\n  }";
-}
-
-std::string ModeObject(const T_MODE_RESULTS& mode)
-{
-    return "  {\n   \"period\": " + ShortestText(mode.period) +
-           ",\n   \"participation\": " + NumberList(mode.participation) +
-           ",\n   \"mass_percent\": " + NumberList(mode.massPercent) +
-           ",\n   \"shape\": " + IdObject(mode.shape, NumberList) + "\n  }";
 }
 
 constexpr double kModeRounding = 1e-10; // of the largest of all modes
@@ -216,31 +152,6 @@ std::string LengthName(const T_UNITS& units)
 std::string MomentName(const T_UNITS& units)
 {
     return ForceName(units) + "*" + LengthName(units);
-}
-
-std::string JsonText(const std::string& text)
-{
-    return nlohmann::json(text).dump(-1, ' ', false, nlohmann::json::error_handler_t::replace);
-}
-
-std::string AnalysisJson(const std::vector<T_SHOWN_CASE>& shown,
-                         const std::vector<T_CASE_RESULTS>& results,
-                         const std::vector<T_MODE_RESULTS>& modes,
-                         const std::vector<T_SHOWN_STAGE>& stages)
-{
-    std::string text = "{\n";
-    text += CaseObject("displacements", shown, results, &T_CASE_RESULTS::displacements, NumberList);
-    text += ",\n" + CaseObject("reactions", shown, results, &T_CASE_RESULTS::reactions, NumberList);
-    text += ",\n" + CaseObject("truss", shown, results, &T_CASE_RESULTS::trusses, ShortestText);
-    text += ",\n" + CaseObject("beam", shown, results, &T_CASE_RESULTS::beams, BeamList);
-    text += ",\n \"modes\": [";
-    for (std::size_t i = 0; i < modes.size(); ++i)
-        text += (i ? ",\n" : "\n") + ModeObject(modes[i]);
-    text += modes.empty() ? "]" : "\n ]";
-    const char* before = ",\n \"stages\": {\n  ";
-    for (const T_SHOWN_STAGE& stage : stages)
-        text += std::exchange(before, ",\n  ") + JsonText(stage.stage) + ": " + StageObject(stage);
-    return text + (stages.empty() ? "\n}\n" : "\n }\n}\n");
 }
 
 std::string StageTitle(const T_SHOWN_STAGE& stage)

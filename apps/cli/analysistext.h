@@ -1,19 +1,9 @@
-// Results of linear analysis as JSON and as tables.
+// Results of linear analysis as tables.
 #pragma once
 
 #include "analysisresults.h"
 
 #include <string>
-
-/// Writes {"displacements": {CASE: {NODE: [6]}}, "reactions": ..., "truss": {CASE: {ELEMENT: N}},
-/// "beam": {CASE: {ELEMENT: [[6] at I, 1/4, 2/4, 3/4, J]}}, "modes": [...]}; cases in the order
-/// given, ids ascending, numbers in their shortest form.
-/// With stages also "stages": {STAGE: {"step": N, "load": LOAD, "elements": number that stand,
-/// "displacements": {NODE: [6]}, "reactions": ..., "truss": ..., "beam": ...}}, of what stands.
-std::string AnalysisJson(const std::vector<T_SHOWN_CASE>& shown,
-                         const std::vector<T_CASE_RESULTS>& results,
-                         const std::vector<T_MODE_RESULTS>& modes,
-                         const std::vector<T_SHOWN_STAGE>& stages);
 
 /// What the tables and the summary call it: stage "S1", step 2 of 3, sum, 12 elements.
 std::string StageTitle(const T_SHOWN_STAGE& stage);
@@ -32,6 +22,3 @@ std::string ModeTable(const std::vector<T_MODE_RESULTS>& modes);
 std::string ForceName(const T_UNITS& units);
 std::string LengthName(const T_UNITS& units);
 std::string MomentName(const T_UNITS& units);
-
-/// The text as a JSON string, with its quotes.
-std::string JsonText(const std::string& text);

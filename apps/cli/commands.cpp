@@ -8,8 +8,8 @@
 #include "qm_rps/pushover/pushovercomparison.h"
 #include "qm_rps/pushover/pushoverreport.h"
 #include "qm_rps/pushovercurvedlg.h"
-#include "resultjson.h"
 #include "resulttable.h"
+#include "json/resultjson.h"
 
 #ifdef QM_UI
 #include "qm_ui/pushover/comparisonplot.h"

@@ -1,13 +1,13 @@
 #include "iteratecommands.h"
 
-#include "analysistext.h"
 #include "inputfile.h"
 #include "output.h"
-#include "qm_base/textformat.h"
 #include "qm_rps/factors/ulfitemchecks.h"
+#include "qm_rps/factors/ulfstageresults.h"
 #include "qm_rps/ulfiterationdochost.h"
 #include "qm_rps/unknownloadfactoriteranal.h"
 #include "ulfrun.h"
+#include "json/jsonwriter.h"
 
 #ifdef QM_UI
 #include "qm_ui/factors/iterationplot.h"
@@ -85,30 +85,34 @@ T_END_WORDS WordsOf(const CUlfIteration& run, const T_ITERATE_OPTIONS& o, bool m
     return kEnds[0];
 }
 
-std::string StepJson(const T_ULF_ITER_STEP& step)
+void Write(CJsonWriter& w, const T_ULF_ITER_STEP& step)
 {
-    std::string text = FormatText("{\"iteration\": %d, \"file\": ", step.iteration) +
-                       JsonText(step.file) + ", \"tolerance\": " + ShortestText(step.tolerance) +
-                       ", \"factors\": [";
-    for (std::size_t i = 0; i < step.rows.size(); ++i)
-        text += std::string(i ? ", " : "") + "{\"place\": " + JsonText(step.rows[i].place) +
-                ", \"case\": " + JsonText(step.rows[i].load) +
-                ", \"factor\": " + ShortestText(step.rows[i].factor + 0.0) +
-                ", \"pretension\": " + (step.rows[i].pretension ? "true" : "false") + "}";
-    return text + "]}";
+    w.Object(kJsonOneLine);
+    w.Member("iteration", step.iteration).Member("file", step.file);
+    w.Member("tolerance", step.tolerance);
+    w.Key("factors").List(kJsonOneLine);
+    for (const T_ULF_ITER_ROW& row : step.rows) {
+        w.Object(kJsonOneLine);
+        w.Member("place", row.place).Member("case", row.load).Member("factor", row.factor + 0.0);
+        w.Member("pretension", row.pretension);
+        w.End();
+    }
+    w.End();
+    w.End();
 }
 
 std::string HistoryJson(const CUlfIteration& run, const char* status)
 {
-    std::string text = "{\n \"status\": " + JsonText(status) +
-                       ",\n \"report\": " + JsonText(run.ReportPath()) + ",\n \"history\": [";
+    CJsonWriter w(JSON_REALS::Shortest);
+    w.Object({1, 0});
+    w.Member("status", status).Member("report", run.ReportPath());
+    w.Key("history").List({2, 1, true});
     for (const T_ULF_ITER_STEP& step : run.History())
-        text += (step.iteration ? ",\n  " : "\n  ") + StepJson(step);
-    text += "\n ],\n \"applied\": [";
-    const std::vector<double> applied = UlfIterApplied(run.History());
-    for (std::size_t i = 0; i < applied.size(); ++i)
-        text += (i ? ", " : "") + ShortestText(applied[i]);
-    return text + "]\n}\n";
+        Write(w, step);
+    w.End();
+    w.Items("applied", UlfIterApplied(run.History()), kJsonOneLine);
+    w.End();
+    return w.Text();
 }
 
 void PrintHistory(const CUlfIteration& run)

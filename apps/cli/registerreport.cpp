@@ -4,7 +4,7 @@
 #include "qm_rps/irpsinterfaceimpl.h"
 #include "qm_rps/rpsmanager.h"
 #include "registrations.h"
-#include "reportjson.h"
+#include "json/reportjson.h"
 
 #include <CLI/CLI.hpp>
 

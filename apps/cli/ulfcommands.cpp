@@ -11,6 +11,7 @@
 #include "qm_rps/unknownloadfactorresultdlg.h"
 #include "qm_rps/unknownstageitemdlg.h"
 #include "ulfrun.h"
+#include "json/ulfjson.h"
 
 #ifdef QM_UI
 #include "modelshape.h"

@@ -1,7 +1,6 @@
 #include "ulfrun.h"
 
 #include "analysecommands.h"
-#include "analysistext.h"
 #include "inputfile.h"
 #include "output.h"
 #include "qm_base/msgfunction.h"
@@ -10,8 +9,6 @@
 #include "qm_rps/unknownstageitemdlg.h"
 
 #include <algorithm>
-#include <array>
-#include <cmath>
 
 using zql::lib::MMSGFunction;
 
@@ -29,47 +26,9 @@ std::string OneLine(std::string text)
     return text;
 }
 
-std::string NumberOrNull(const std::optional<double>& v)
-{
-    return v ? ShortestText(*v + 0.0) : "null";
-}
-
 std::string Short(const std::optional<double>& v)
 {
     return v ? FormatText("%.7g", *v + 0.0) : "-";
-}
-
-std::string FactorsJson(const T_ULF_RESULT& r)
-{
-    std::string text = "{";
-    for (std::size_t i = 0; i < r.cases.size(); ++i)
-        text += (i ? ",\n  " : "\n  ") + JsonText(r.cases[i].name) + ": " +
-                ShortestText(r.factors[i] + 0.0);
-    return text + "\n }";
-}
-
-std::string ConstraintsJson(const T_ULF_RESULT& r)
-{
-    std::string text = "[";
-    for (const T_ULF_RESULT_ROW& row : UlfResultRows(r))
-        text += (text.size() > 1 ? ",\n  {" : "\n  {") + ("\"name\": " + JsonText(row.name)) +
-                (row.place.empty() ? "" : ", \"place\": " + JsonText(row.place)) +
-                ", \"value\": " + ShortestText(row.value + 0.0) +
-                ", \"upper\": " + NumberOrNull(row.upper) +
-                ", \"lower\": " + NumberOrNull(row.lower) +
-                ", \"residual\": " + ShortestText(row.residual + 0.0) +
-                ", \"active\": " + (row.active ? "true" : "false") + "}";
-    return text + "\n ]";
-}
-
-/// [ ... ], one to a line.
-template <class T, class F>
-std::string List(const std::vector<T>& items, const F& print)
-{
-    std::string text = "[";
-    for (const T& item : items)
-        text += (text.size() > 1 ? ",\n  " : "\n  ") + print(item);
-    return text + (items.empty() ? "]" : "\n ]");
 }
 
 template <class ROWS, class F>
@@ -151,46 +110,6 @@ T_ULF_OUTCOME SolveUlf(CUlfItemDialog& dialog)
     out.status = none ? "not found" : "refused";
     out.code = none ? EXIT_CODE::NotFound : EXIT_CODE::BadInput;
     return out;
-}
-
-std::string UlfJson(const T_ULF_OUTCOME& o, const std::optional<T_ULF_RESULT>& r)
-{
-    return "{\n \"status\": " + JsonText(o.status) +
-           ",\n \"code\": " + std::to_string(o.solverCode) +
-           ",\n \"message\": " + JsonText(o.message) +
-           ",\n \"mode\": " + (o.exact ? "\"[EXACT]\"" : "\"[OPTIMIZE]\"") +
-           ",\n \"factors\": " + (r ? FactorsJson(*r) : "{}") +
-           ",\n \"constraints\": " + (r ? ConstraintsJson(*r) : "[]") +
-           ",\n \"objective\": " + (r ? ShortestText(UlfObjective(*r)) : "null") + "\n}\n";
-}
-
-std::string ExplainJson(const T_ULF_EXPLAINED& e)
-{
-    const auto limit = [](const auto& h) {
-        static constexpr std::array<const char*, 4> kNames{"target", "upper", "lower", "sign"};
-        return "{\"name\": " + JsonText(h.name) + ", \"limit\": \"" +
-               kNames[static_cast<std::size_t>(h.limit)] +
-               "\", \"value\": " + ShortestText(h.value + 0.0) + ", \"unit\": " + JsonText(h.unit);
-    };
-    const std::string tail = ",\n \"compromise\": ";
-    std::string text =
-        FormatText("{\n \"solved\": %s,\n \"unknowns\": %d,\n \"rows\": %d,\n \"rank\": %d,\n ",
-                   e.solved ? "true" : "false", e.unknowns, e.rows, e.rank) +
-        "\"condition\": " + ShortestText(e.condition) +
-        ",\n \"unfelt\": " + List(e.unfelt, JsonText) +
-        ",\n \"objective\": " + (e.solved ? ShortestText(e.objective + 0.0) : "null") +
-        ",\n \"held\": " +
-        List(e.held,
-             [&](const T_ULF_HOLD& h) {
-                 return limit(h) + ", \"multiplier\": " + ShortestText(h.multiplier + 0.0) + "}";
-             }) +
-        ",\n \"conflict\": " +
-        List(e.conflict, [&](const T_ULF_CLASH& c) { return limit(c) + "}"; }) +
-        ",\n \"conflict_with_sign\": " + (e.conflictWithSign ? "true" : "false") + tail;
-    text += e.compromise ? "{\n \"factors\": " + FactorsJson(*e.compromise) +
-                               ",\n \"constraints\": " + ConstraintsJson(*e.compromise) + "\n }"
-                         : "null";
-    return text + ",\n \"lines\": " + List(e.lines, JsonText) + "\n}\n";
 }
 
 std::string UlfTables(const T_ULF_RESULT& r)

@@ -41,9 +41,5 @@ EXIT_CODE AnalyseStages(CDBDoc& doc, const std::string& file);
 /// Calculates and names the outcome.
 T_ULF_OUTCOME SolveUlf(CUlfItemDialog& dialog);
 
-/// {"status", "code", "message", "mode", "factors", "constraints", "objective"}.
-std::string UlfJson(const T_ULF_OUTCOME& outcome, const std::optional<T_ULF_RESULT>& result);
-/// What holds the solution, or what contradicts, with the words of ExplainUlf in "lines".
-std::string ExplainJson(const T_ULF_EXPLAINED& explained);
 /// Tables of the factors and of the constraints.
 std::string UlfTables(const T_ULF_RESULT& result);

@@ -5,7 +5,7 @@
 #include "qm_base/textformat.h"
 #include "qm_db/filectrl.h"
 #include "qm_rps/pushovercurvedlg.h"
-#include "resultjson.h"
+#include "json/resultjson.h"
 
 #include <nlohmann/json.hpp>
 

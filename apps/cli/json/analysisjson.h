@@ -1,0 +1,16 @@
+// Results of linear analysis as JSON.
+#pragma once
+
+#include "analysisresults.h"
+
+#include <string>
+
+/// Writes {"displacements": {CASE: {NODE: [6]}}, "reactions": ..., "truss": {CASE: {ELEMENT: N}},
+/// "beam": {CASE: {ELEMENT: [[6] at I, 1/4, 2/4, 3/4, J]}}, "modes": [...]}; cases in the order
+/// given, ids ascending, numbers in their shortest form.
+/// With stages also "stages": {STAGE: {"step": N, "load": LOAD, "elements": number that stand,
+/// "displacements": {NODE: [6]}, "reactions": ..., "truss": ..., "beam": ...}}, of what stands.
+std::string AnalysisJson(const std::vector<T_SHOWN_CASE>& shown,
+                         const std::vector<T_CASE_RESULTS>& results,
+                         const std::vector<T_MODE_RESULTS>& modes,
+                         const std::vector<T_SHOWN_STAGE>& stages);

@@ -1,0 +1,199 @@
+#include "json/resultjson.h"
+
+#include "qm_rps/pushover/fema440coefficients.h"
+
+namespace {
+
+void WriteFactors(CJsonWriter& w, const T_PUSH_EVALUATION& e)
+{
+    const T_PUSH_FACTORS& f = e.factors;
+    w.Key("factors").Object();
+    w.Member("gamma", f.gamma).Member("alpha", f.alpha).Member("mass", f.mass);
+    w.Member("gravity", f.gravity).Member("eigen_based", f.eigenBased).Member("mode", f.mode);
+    w.Member("note", e.gammaNote);
+    w.End();
+}
+
+void Write(CJsonWriter& w, const std::optional<T_PERF_POINT>& p)
+{
+    if (!p) return w.Value(nullptr);
+    w.Object();
+    w.Member("Sd", p->Sd).Member("Sa", p->Sa).Member("D", p->D).Member("V", p->V);
+    w.Member("T_eff", p->Teff).Member("damping", p->damping);
+    w.End();
+}
+
+/// The members of a target displacement; null where its derivation did not come so far.
+void WriteMembers(CJsonWriter& w, const T_TARGET_DISP& t, bool derived)
+{
+    const struct {
+        const char* key;
+        std::optional<double> value;
+    } rows[] = {{"T_star", t.Tstar}, {"Tc", t.Tc}, {"Se", t.Se},        {"ay", t.ay},
+                {"dy", t.dy},        {"Fy", t.Fy}, {"m_star", t.mStar}, {"det", t.det},
+                {"dt", t.dt},        {"qu", t.qu}};
+    for (const auto& row : rows)
+        w.Member(row.key, derived ? row.value : std::nullopt);
+    if (!derived) return;
+    w.Member("branch", t.qu ? "short period" : "medium or long period");
+    w.Member("capped", t.capped).Member("bilinear_fits", t.iterations);
+}
+
+/// How each target displacement came about, found or not.
+void WriteDerivation(CJsonWriter& w, const T_PUSH_EVALUATION& e)
+{
+    w.Key("derivation").List();
+    for (std::size_t i = 0; i < e.targets.size(); ++i) {
+        const T_TARGET_DISP& t = e.targets[i];
+        w.Object();
+        w.Member("limit_state", e.targets.size() > 1 ? kLimitStateNames[i] : "SD");
+        w.Member("found", t.found);
+        WriteMembers(w, t, t.Tstar > 0.0);
+        w.End();
+    }
+    w.End();
+}
+
+void WriteTarget(CJsonWriter& w, const T_PUSH_EVALUATION& e)
+{
+    w.Key("target");
+    if (!e.IsTarget() || e.result == 0) return w.Value(nullptr);
+    const bool one = e.eval.method == PUSH_METHOD::Ec8Opcm;
+    if (!one) w.List();
+    for (std::size_t i = 0; i < (one ? 1 : e.targets.size()); ++i) {
+        w.Object();
+        if (!one) w.Member("limit_state", kLimitStateNames[i]);
+        WriteMembers(w, e.targets[i], e.targets[i].found);
+        w.End();
+    }
+    if (!one) w.End();
+}
+
+void WriteLimitStates(CJsonWriter& w, const T_PUSH_EVALUATION& e)
+{
+    w.Key("limit_states").List();
+    for (const T_LIMIT_ROW& r : e.limitStates) {
+        w.Object();
+        w.Member("name", r.name).Member("demand", r.demand).Member("demand_step", r.demandStep);
+        w.Member("capacity", r.capacity).Member("capacity_step", r.capacityStep);
+        w.Member("remark", r.remark.empty() ? std::nullopt : std::optional(r.remark));
+        w.End();
+    }
+    w.End();
+}
+
+void Write(CJsonWriter& w, const T_PERFPT_TRIAL& t)
+{
+    const auto add = [&](const char* key, const std::optional<double>& v) {
+        if (v) w.Member(key, *v);
+    };
+    w.Object();
+    w.Member("trial", t.trial).Member("dpi", t.dpi).Member("api", t.api);
+    add("dy", t.dy);
+    add("ay", t.ay);
+    add("alpha", t.alpha);
+    add("mu", t.mu);
+    if (t.row) w.Member("coefficients", Fema440RowText(*t.row));
+    add("kappa", t.kappa);
+    add("beta_eff", t.betaEff);
+    add("SRa", t.SRa);
+    add("SRv", t.SRv);
+    add("T_eff", t.Teff);
+    add("M", t.M);
+    add("Di", t.Di);
+    add("Ai", t.Ai);
+    w.End();
+}
+
+void Write(CJsonWriter& w, const T_ADDITIONAL_STEP& s)
+{
+    w.Object();
+    w.Member("step", s.step).Member("D", s.D).Member("V", s.V);
+    w.Member("Sd", s.Sd).Member("Sa", s.Sa);
+    w.End();
+}
+
+void Write(CJsonWriter& w, const T_ADDITIONAL_POINT& p)
+{
+    w.Object();
+    w.Member("spectrum", p.spectrum).Member("status", StatusName(p.result));
+    w.Key("performance_point");
+    Write(w, p.point);
+    w.Key("outcome").Object();
+    w.Member("name", OutcomeName(p.outcome));
+    w.End();
+    w.End();
+}
+
+template <class T>
+void WriteList(CJsonWriter& w, const char* key, const std::vector<T>& items)
+{
+    w.Key(key).List();
+    for (const T& item : items)
+        Write(w, item);
+    w.End();
+}
+
+void WriteOutcome(CJsonWriter& w, const T_PUSH_EVALUATION& e)
+{
+    const std::string advice = OutcomeAdvice(e.outcome);
+    w.Key("outcome").Object();
+    w.Member("name", OutcomeName(e.outcome));
+    w.Member("advice", e.pointNote.empty() ? advice : advice + " " + e.pointNote);
+    w.End();
+    w.Key("messages").List();
+    for (const auto& m : e.messages) {
+        w.Object();
+        w.Member("key", m.key).Member("text", m.text);
+        w.End();
+    }
+    w.End();
+}
+
+void Write(CJsonWriter& w, const T_PUSH_EVALUATION& e)
+{
+    w.Object();
+    w.Member("name", e.eval.name).Member("push", e.eval.push);
+    w.Member("method", MethodName(e.eval.method));
+    w.Member("procedure", std::string_view(&e.procedure, 1));
+    w.Member("status", StatusName(e.result));
+    WriteFactors(w, e);
+    w.Key("capacity").Object();
+    w.Items("Sd", e.capacity.Sd, kJsonNested).Items("Sa", e.capacity.Sa, kJsonNested);
+    w.End();
+    w.Key("performance_point");
+    Write(w, e.point);
+    WriteTarget(w, e);
+    WriteLimitStates(w, e);
+    WriteOutcome(w, e);
+    if (!e.IsTarget()) WriteList(w, "all_points", e.allPoints);
+    if (!e.additionalSteps.empty()) WriteList(w, "additional_steps", e.additionalSteps);
+    if (!e.additionalPoints.empty()) WriteList(w, "additional_points", e.additionalPoints);
+    if (e.IsTarget()) WriteDerivation(w, e);
+    w.Member("trials", e.trace.size());
+    WriteList(w, "trace", e.trace);
+    w.End();
+}
+
+} // namespace
+
+const char* StatusName(int result)
+{
+    static constexpr const char* kStatus[] = {"not found", "found", "elastic"};
+    return kStatus[result];
+}
+
+void WriteResults(CJsonWriter& w, const std::vector<T_PUSH_EVALUATION>& results)
+{
+    w.List();
+    for (const T_PUSH_EVALUATION& e : results)
+        Write(w, e);
+    w.End();
+}
+
+std::string ResultJson(const std::vector<T_PUSH_EVALUATION>& results)
+{
+    CJsonWriter w(JSON_REALS::WithPoint);
+    WriteResults(w, results);
+    return w.Text();
+}

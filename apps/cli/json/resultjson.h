@@ -1,0 +1,17 @@
+// Results of evaluations as JSON: a list with one object per evaluation.
+#pragma once
+
+#include "qm_rps/pushover/pushevaluation.h"
+#include "json/jsonwriter.h"
+
+#include <string>
+#include <vector>
+
+/// The list as the next value. What does not exist is null.
+void WriteResults(CJsonWriter& writer, const std::vector<T_PUSH_EVALUATION>& results);
+
+/// The list as a text of its own. Numbers print shortest round trip; ends with a line end.
+std::string ResultJson(const std::vector<T_PUSH_EVALUATION>& results);
+
+/// "not found", "found" or "elastic", for the status of a result.
+const char* StatusName(int result);
