@@ -85,7 +85,7 @@ struct T_READY {
     CFrameDofs dofs{Frame()};
     CFrameAssembly assembly;
     CSparseFactor factor;
-    std::string reason;
+    T_SOLVER_REASON reason;
     bool good = false;
     T_READY()
     {
@@ -103,11 +103,11 @@ T_READY& Ready()
 
 void AssembleFirst(benchmark::State& state)
 {
-    std::string reason;
+    T_SOLVER_REASON reason;
     for (auto _ : state) {
         const CFrameDofs dofs(Frame());
         CFrameAssembly assembly;
-        if (!assembly.Prepare(Frame(), dofs, reason)) state.SkipWithError(reason.c_str());
+        if (!assembly.Prepare(Frame(), dofs, reason)) state.SkipWithError(reason.Text().c_str());
         assembly.Assemble(Frame());
         if (dofs.EquationCount() != 100224) state.SkipWithError("unknowns missing");
     }
@@ -127,7 +127,7 @@ void FactoriseMatrix(benchmark::State& state)
     T_READY& ready = Ready();
     for (auto _ : state)
         if (!ready.good || !ready.factor.Factor(ready.assembly.Matrix(), ready.reason))
-            state.SkipWithError(ready.reason.c_str());
+            state.SkipWithError(ready.reason.Text().c_str());
 }
 BENCHMARK(FactoriseMatrix)->Unit(benchmark::kMillisecond)->Iterations(2);
 
@@ -137,7 +137,7 @@ void SolveOneSide(benchmark::State& state)
     for (auto _ : state) {
         std::vector<double> side(ready.dofs.EquationCount(), 1.0);
         if (!ready.good || !ready.factor.Solve(side, 1, ready.reason))
-            state.SkipWithError(ready.reason.c_str());
+            state.SkipWithError(ready.reason.Text().c_str());
     }
 }
 BENCHMARK(SolveOneSide)->Unit(benchmark::kMillisecond)->Iterations(5);
@@ -152,10 +152,11 @@ void EngineNumeric(benchmark::State& state)
         ready.assembly.Assemble(Frame());
         T_SOLVER_ERROR error;
         if (!FactorStable(Frame(), ready.dofs, ready.assembly.Matrix(), ready.factor, error))
-            state.SkipWithError(error.reason.c_str());
+            state.SkipWithError(error.reason.Text().c_str());
         const CCaseBlock block(Frame(), ready.dofs, load);
         std::vector<double> x = block.RightSides();
-        if (!ready.factor.Solve(x, 1, ready.reason)) state.SkipWithError(ready.reason.c_str());
+        if (!ready.factor.Solve(x, 1, ready.reason))
+            state.SkipWithError(ready.reason.Text().c_str());
         std::vector<T_RESULT> results;
         block.Recover(x, results);
         if (!(results[0].displacement.back()[2] < 0.0)) state.SkipWithError("no settlement");
@@ -245,7 +246,7 @@ void FurtherCase(benchmark::State& state)
     constexpr std::size_t kFurther = 32;
     CFrameSolver engine;
     T_SOLVER_ERROR error;
-    if (!engine.Prepare(Frame(), error)) state.SkipWithError(error.reason.c_str());
+    if (!engine.Prepare(Frame(), error)) state.SkipWithError(error.reason.Text().c_str());
     std::vector<T_LOAD_CASE> cases{Load(0)};
     for (std::size_t c = 0; c < kFurther; ++c)
         cases.push_back(Load(c + 1));
@@ -254,7 +255,7 @@ void FurtherCase(benchmark::State& state)
         const auto solve = [&](std::size_t count) {
             return Seconds([&] {
                 if (!engine.Solve(std::span(cases).first(count), results, error))
-                    state.SkipWithError(error.reason.c_str());
+                    state.SkipWithError(error.reason.Text().c_str());
             });
         };
         const double one = solve(1), all = solve(cases.size());
@@ -274,7 +275,7 @@ void EngineMemory(benchmark::State& state)
         std::vector<T_RESULT> results;
         if (!engine.Prepare(Frame(), error) ||
             !engine.Solve(std::vector<T_LOAD_CASE>{Load(0)}, results, error))
-            state.SkipWithError(error.reason.c_str());
+            state.SkipWithError(error.reason.Text().c_str());
         state.SetIterationTime((Resident() - before) * 1e-9);
     }
 }

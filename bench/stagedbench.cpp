@@ -88,7 +88,7 @@ bool Check(benchmark::State& state, CStagedSolver& staged)
     T_SOLVER_ERROR error;
     T_RESULT r;
     if (!staged.Run(Loads(), error)) {
-        state.SkipWithError(error.reason.c_str());
+        state.SkipWithError(error.reason.Text().c_str());
         return false;
     }
     const bool good = staged.ReadCase(kStages - 1, kLastStep, 0, r) &&
@@ -102,7 +102,7 @@ void StagesFirst(benchmark::State& state)
     Measure(state, [&] {
         CStagedSolver staged;
         T_SOLVER_ERROR error;
-        if (!staged.Prepare(Model(), error)) state.SkipWithError(error.reason.c_str());
+        if (!staged.Prepare(Model(), error)) state.SkipWithError(error.reason.Text().c_str());
         Check(state, staged);
     });
 }
@@ -116,7 +116,7 @@ void StagesAgain(benchmark::State& state)
 {
     CStagedSolver staged;
     T_SOLVER_ERROR error;
-    if (!staged.Prepare(Model(), error)) state.SkipWithError(error.reason.c_str());
+    if (!staged.Prepare(Model(), error)) state.SkipWithError(error.reason.Text().c_str());
     Check(state, staged); // the first run also looks for mechanisms
     Measure(state, [&] { Check(state, staged); });
 }
@@ -149,12 +149,13 @@ T_PARTS& Parts()
 void PartsFactorised(benchmark::State& state)
 {
     auto& parts = Parts().parts;
-    std::string reason;
+    T_SOLVER_REASON reason;
     if (parts.size() != kStages || parts.back()->Dofs().EquationCount() != 20280)
         state.SkipWithError("parts missing");
     Measure(state, [&] {
         for (auto& part : parts)
-            if (!part->Factor().Factor(part->Matrix(), reason)) state.SkipWithError(reason.c_str());
+            if (!part->Factor().Factor(part->Matrix(), reason))
+                state.SkipWithError(reason.Text().c_str());
     });
 }
 BENCHMARK(PartsFactorised)
@@ -165,13 +166,13 @@ BENCHMARK(PartsFactorised)
 
 void PartsAnalysedAndFactorised(benchmark::State& state)
 {
-    std::string reason;
+    T_SOLVER_REASON reason;
     Measure(state, [&] {
         for (auto& part : Parts().parts) {
             CSparseFactor factor;
             if (!factor.Analyse(part->Matrix(), part->Dofs().Blocks(), reason) ||
                 !factor.Factor(part->Matrix(), reason))
-                state.SkipWithError(reason.c_str());
+                state.SkipWithError(reason.Text().c_str());
         }
     });
 }

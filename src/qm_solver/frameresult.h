@@ -2,6 +2,7 @@
 #pragma once
 
 #include "qm_solver/framemodel.h"
+#include "qm_solver/solverreason.h"
 
 #include <string>
 
@@ -65,7 +66,7 @@ struct T_SOLVER_ERROR {
     int direction = -1; // 0 to 5, of a mechanism at a node
     /// Nodes of a part of the model that moves as a rigid body; empty otherwise.
     std::vector<std::size_t> part;
-    std::string reason; // "zero length", "the part is free to move along X and to turn about Z"
+    T_SOLVER_REASON reason; // zero length; the part is free to move along X and to turn about Z
 };
 
 } // namespace solver

@@ -20,7 +20,7 @@ namespace {
 
 constexpr std::size_t kCaseBlock = 64; // right-hand sides solved together
 
-T_SOLVER_ERROR Failed(std::string reason)
+T_SOLVER_ERROR Failed(T_SOLVER_REASON reason)
 {
     T_SOLVER_ERROR error;
     error.fault = SOLVER_FAULT::Failed;
@@ -45,7 +45,7 @@ struct CFrameSolver::T_STATE {
 
 std::optional<T_SOLVER_ERROR> CFrameSolver::T_STATE::Factorise()
 {
-    std::string reason;
+    T_SOLVER_REASON reason;
     if (!assembly.Prepare(frame, dofs, reason)) return Failed(reason);
     assembly.Assemble(frame);
     if (dofs.EquationCount() == 0) return {}; // everything is held
@@ -62,7 +62,7 @@ std::optional<T_SOLVER_ERROR> CFrameSolver::T_STATE::SolveBlock(std::span<const 
     const CCaseBlock block(frame, dofs, cases);
     const std::vector<double> loads = block.RightSides();
     std::vector<double> x = loads;
-    std::string reason;
+    T_SOLVER_REASON reason;
     const std::size_t n = dofs.EquationCount();
     if (n > 0 && !factor.Solve(x, cases.size(), reason)) return Failed(reason);
     for (std::size_t c = 0; c < cases.size(); ++c)
@@ -104,7 +104,7 @@ int CFrameSolver::Solve(std::span<const T_LOAD_CASE> cases, std::vector<T_RESULT
 {
     out.clear();
     std::optional<T_SOLVER_ERROR> fault;
-    if (!m_state) fault = Failed("no model is prepared");
+    if (!m_state) fault = Failed("IDS_QM_ENGINE_NOT_PREPARED");
     for (std::size_t c = 0; c < cases.size() && !fault; ++c)
         fault = CheckCase(m_state->frame, m_state->dofs, cases[c], c);
     std::vector<T_RESULT> results;
@@ -115,7 +115,7 @@ int CFrameSolver::Solve(std::span<const T_LOAD_CASE> cases, std::vector<T_RESULT
         if (!fault && progress && !progress(first + count, cases.size())) {
             fault.emplace();
             fault->fault = SOLVER_FAULT::Cancelled;
-            fault->reason = "cancelled";
+            fault->reason = "IDS_QM_ENGINE_CANCELLED";
         }
     }
     if (fault) {
@@ -131,7 +131,7 @@ int CFrameSolver::Modes(std::size_t count, std::vector<T_MODE>& out, T_SOLVER_ER
 {
     out.clear();
     if (!m_state) {
-        error = Failed("no model is prepared");
+        error = Failed("IDS_QM_ENGINE_NOT_PREPARED");
         return 0;
     }
     return SolveModes(m_state->frame, m_state->dofs, m_state->assembly.Matrix(), m_state->factor,

@@ -85,7 +85,7 @@ int CStagedSolver::Run(std::span<const T_LOAD_CASE> cases, T_SOLVER_ERROR& error
     if (!m_state || cases.size() != m_state->prepared->model.groups.size()) {
         fault.emplace();
         fault->fault = m_state ? SOLVER_FAULT::BadModel : SOLVER_FAULT::Failed;
-        fault->reason = m_state ? "not every load case has its group" : "no model is prepared";
+        fault->reason = m_state ? "IDS_QM_ENGINE_NO_GROUP" : "IDS_QM_ENGINE_NOT_PREPARED";
     } else {
         T_PREPARED& p = *m_state->prepared;
         m_state->run.emplace(p.model, p.plan, p.parts, p.partOf, cases, m_state->cost);

@@ -128,7 +128,7 @@ TEST(FrameRefusals, RefusesModelsAndNamesThePlace)
         if (c.fault == kBad || c.node >= 0) {
             EXPECT_EQ(c.node, error.node);
         }
-        EXPECT_NE(std::string::npos, error.reason.find(c.reason)) << error.reason;
+        EXPECT_NE(std::string::npos, error.reason.Text().find(c.reason)) << error.reason.Text();
         std::vector<T_RESULT> out;
         EXPECT_FALSE(frameSolver.Solve(std::vector<T_LOAD_CASE>(1), out, error));
     }
@@ -253,7 +253,7 @@ TEST(FrameRefusals, RefusesLoadsAndNamesThePlace)
     AddNode(frame, {9, 9, 9});
     CFrameSolver frameSolver;
     T_SOLVER_ERROR error;
-    ASSERT_TRUE(frameSolver.Prepare(frame, error)) << error.reason;
+    ASSERT_TRUE(frameSolver.Prepare(frame, error)) << error.reason.Text();
     for (const T_REFUSED_CASE& c : kCases) {
         SCOPED_TRACE(c.label);
         std::vector<T_LOAD_CASE> cases(2);
@@ -266,7 +266,7 @@ TEST(FrameRefusals, RefusesLoadsAndNamesThePlace)
         EXPECT_EQ(1, error.loadCase);
         EXPECT_EQ(c.node, error.node);
         EXPECT_EQ(c.element, error.element);
-        EXPECT_NE(std::string::npos, error.reason.find(c.reason)) << error.reason;
+        EXPECT_NE(std::string::npos, error.reason.Text().find(c.reason)) << error.reason.Text();
     }
     std::vector<T_RESULT> out;
     EXPECT_TRUE(frameSolver.Solve(std::vector<T_LOAD_CASE>(1), out, error)) << "still usable";

@@ -20,8 +20,8 @@ std::vector<T_MODE> Modes(const T_FRAME& frame, std::size_t count)
     CFrameSolver solver;
     T_SOLVER_ERROR error;
     std::vector<T_MODE> modes;
-    EXPECT_EQ(1, solver.Prepare(frame, error)) << error.reason;
-    EXPECT_EQ(1, solver.Modes(count, modes, error)) << error.reason;
+    EXPECT_EQ(1, solver.Prepare(frame, error)) << error.reason.Text();
+    EXPECT_EQ(1, solver.Modes(count, modes, error)) << error.reason.Text();
     return modes;
 }
 
@@ -257,7 +257,8 @@ TEST(Modes, NeedMassThatCanMoveAndCanBeCancelled)
     EXPECT_EQ(0, solver.Modes(3, modes, error, stop));
     EXPECT_EQ(SOLVER_FAULT::Cancelled, error.fault);
     EXPECT_EQ(5u, calls);
-    EXPECT_EQ(1, solver.Modes(3, modes, error)) << error.reason; // as if nothing had happened
+    EXPECT_EQ(1, solver.Modes(3, modes, error))
+        << error.reason.Text(); // as if nothing had happened
     EXPECT_EQ(3u, modes.size());
 }
 

@@ -180,8 +180,8 @@ TEST(Reference, EveryRecordedResultIsMet)
         CFrameSolver frameSolver;
         T_SOLVER_ERROR error;
         std::vector<T_RESULT> results;
-        ASSERT_TRUE(frameSolver.Prepare(bridge.frame, error)) << error.reason;
-        ASSERT_TRUE(frameSolver.Solve(bridge.cases, results, error)) << error.reason;
+        ASSERT_TRUE(frameSolver.Prepare(bridge.frame, error)) << error.reason.Text();
+        ASSERT_TRUE(frameSolver.Solve(bridge.cases, results, error)) << error.reason.Text();
         std::size_t rows = 0;
         const std::string path =
             std::string(QM_TEST_DATA) + "/linear/" + f.bridge + "/" + f.file + ".csv";

@@ -466,14 +466,14 @@ TEST(StagedSolver, RunsAgainWithoutAnotherAnalysis)
     T_LOAD_CASE twice = Weight();
     twice.selfWeight[2] *= 2;
     T_SOLVER_ERROR error;
-    ASSERT_TRUE(staged.Run(std::vector<T_LOAD_CASE>{twice}, error)) << error.reason;
+    ASSERT_TRUE(staged.Run(std::vector<T_LOAD_CASE>{twice}, error)) << error.reason.Text();
     EXPECT_EQ(kSegments, staged.Cost().analyses);
     ExpectSame(Sum(once, once), Case(staged, kSegments, 0), 1e-12);
 
     CStagedSolver other = staged.Again();
     T_RESULT none;
     EXPECT_FALSE(other.ReadCase(kSegments, kLastStep, 0, none));
-    ASSERT_TRUE(other.Run(std::vector<T_LOAD_CASE>{Weight()}, error)) << error.reason;
+    ASSERT_TRUE(other.Run(std::vector<T_LOAD_CASE>{Weight()}, error)) << error.reason.Text();
     EXPECT_EQ(0U, other.Cost().analyses);
     ExpectSame(once, Case(other, kSegments, 0), 1e-12);
     ExpectSame(Sum(once, once), Case(staged, kSegments, 0), 1e-12); // stays

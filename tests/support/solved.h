@@ -18,7 +18,8 @@ inline std::vector<T_RESULT> Solved(const T_FRAME& frame, const std::vector<T_LO
     T_SOLVER_ERROR error;
     std::vector<T_RESULT> results;
     if (!frameSolver.Prepare(frame, error) || !frameSolver.Solve(cases, results, error))
-        ADD_FAILURE() << error.reason << " node " << error.node << " element " << error.element;
+        ADD_FAILURE() << error.reason.Text() << " node " << error.node << " element "
+                      << error.element;
     return results;
 }
 

@@ -39,8 +39,8 @@ inline void Build(CStagedSolver& staged, const T_STAGED_MODEL& model,
 {
     T_SOLVER_ERROR error;
     if (!staged.Prepare(model, error) || !staged.Run(cases, error))
-        ADD_FAILURE() << error.reason << " stage " << error.stage << " case " << error.loadCase
-                      << " node " << error.node << " element " << error.element;
+        ADD_FAILURE() << error.reason.Text() << " stage " << error.stage << " case "
+                      << error.loadCase << " node " << error.node << " element " << error.element;
 }
 
 inline T_RESULT Case(const CStagedSolver& staged, std::size_t stage, std::size_t loadCase,

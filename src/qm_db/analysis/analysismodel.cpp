@@ -321,6 +321,6 @@ T_ANALYSIS_ERROR CAnalysisModel::ErrorOf(const solver::T_SOLVER_ERROR& error,
                 ? FormatText("part of %zu nodes at node %d", out.part.size(), out.node)
                 : FormatText("node %d", out.node));
     }
-    out.text += (out.text.empty() ? "" : ": ") + error.reason;
+    out.text += (out.text.empty() ? "" : ": ") + error.reason.Text();
     return out;
 }

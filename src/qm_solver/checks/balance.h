@@ -8,8 +8,7 @@
 
 namespace solver {
 
-inline constexpr const char* kOutOfBalance =
-    "the forces do not balance: the model is nearly unstable or its stiffnesses differ too much";
+inline constexpr const char* kOutOfBalance = "IDS_QM_ENGINE_OUT_OF_BALANCE";
 
 /// Forces out of balance are at most 1e-5 of the largest load of the column, moments taken over
 /// `extent`: stiffness contrasts of 1e10 stay below, a motion that escaped the factorisation does

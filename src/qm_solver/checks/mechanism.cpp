@@ -30,7 +30,7 @@ void Normalise(std::span<double> v)
 /// Null vectors, column after column: with v = 1 at the vanished pivot p the rest follows from the
 /// column p of the matrix; the other vanished unknowns are 0.
 int NullVectors(const T_SYMMETRIC_MATRIX& k, CSparseFactor& factor, std::vector<double>& columns,
-                std::string& reason)
+                T_SOLVER_REASON& reason)
 {
     std::vector<std::size_t> pivots = factor.Info().nullPivots;
     pivots.resize(std::min(pivots.size(), kMaxCandidates));
@@ -49,7 +49,7 @@ int NullVectors(const T_SYMMETRIC_MATRIX& k, CSparseFactor& factor, std::vector<
 
 /// Inverse iteration from forces of changing sign, in proportion to the stiffness at hand.
 int SoftestShape(const T_SYMMETRIC_MATRIX& k, CSparseFactor& factor, std::vector<double>& v,
-                 std::string& reason)
+                 T_SOLVER_REASON& reason)
 {
     std::vector<double> diagonal(k.Size(), 0.0);
     ForEachEntry(k, [&](std::size_t i, std::size_t j, double value) {
@@ -92,7 +92,7 @@ bool StrainsNothing(const T_FRAME& frame, std::span<const T_AXIAL> axial,
     return std::fabs(energy) <= kStrainless * std::fabs(apart);
 }
 
-int Fail(T_SOLVER_ERROR& error, std::string reason)
+int Fail(T_SOLVER_ERROR& error, T_SOLVER_REASON reason)
 {
     error = {};
     error.fault = SOLVER_FAULT::Failed;
@@ -104,7 +104,7 @@ int Fail(T_SOLVER_ERROR& error, std::string reason)
 
 int FindMechanism(const T_SYMMETRIC_MATRIX& k, CSparseFactor& factor,
                   const StrainlessFn& strainless, std::optional<std::vector<double>>& out,
-                  std::string& reason)
+                  T_SOLVER_REASON& reason)
 {
     out.reset();
     const std::size_t n = k.Size();
@@ -126,7 +126,7 @@ int FindMechanism(const T_SYMMETRIC_MATRIX& k, CSparseFactor& factor,
 int FactorStable(const T_FRAME& frame, const CFrameDofs& dofs, const T_SYMMETRIC_MATRIX& k,
                  CSparseFactor& factor, T_SOLVER_ERROR& error, std::span<const T_AXIAL> axial)
 {
-    std::string reason;
+    T_SOLVER_REASON reason;
     std::optional<std::vector<double>> shape;
     std::vector<double> full(dofs.FullCount());
     const auto strainless = [&](std::span<const double> v) {
@@ -146,8 +146,7 @@ int FactorStable(const T_FRAME& frame, const CFrameDofs& dofs, const T_SYMMETRIC
     error.fault = SOLVER_FAULT::Mechanism;
     error.node = static_cast<long>(at / 6);
     error.direction = static_cast<int>(at % 6);
-    error.reason = std::string("the node is free to ") + kMotionName[at % 6] +
-                   ": nothing resists this movement";
+    error.reason = {"IDS_QM_ENGINE_NODE_FREE", {kMotionKeys[at % 6]}};
     return 0;
 }
 

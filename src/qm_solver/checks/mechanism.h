@@ -23,7 +23,7 @@ using StrainlessFn = std::function<bool(std::span<const double> displacement)>;
 /// Returns 1 with `out` set or empty; 0 `reason` filled (the solution failed).
 [[nodiscard]] int FindMechanism(const T_SYMMETRIC_MATRIX& k, CSparseFactor& factor,
                                 const StrainlessFn& strainless,
-                                std::optional<std::vector<double>>& out, std::string& reason);
+                                std::optional<std::vector<double>>& out, T_SOLVER_REASON& reason);
 
 /// Factorises the stiffness matrix of a frame, whose pattern `factor` has analysed, and makes sure
 /// that nothing moves: a mechanism is one whose strain energy, element by element from their

@@ -1,6 +1,5 @@
 #include "qm_solver/checks/modelcheck.h"
 
-#include "qm_base/textformat.h"
 #include "qm_solver/element/beamelement.h"
 
 #include <algorithm>
@@ -14,20 +13,20 @@ namespace {
 
 using T_FAULT = std::optional<T_SOLVER_ERROR>;
 
-T_SOLVER_ERROR Bad(std::string reason)
+T_SOLVER_ERROR Bad(T_SOLVER_REASON reason)
 {
     T_SOLVER_ERROR error;
     error.fault = SOLVER_FAULT::BadModel;
     error.reason = std::move(reason);
     return error;
 }
-T_SOLVER_ERROR BadNode(std::size_t node, std::string reason)
+T_SOLVER_ERROR BadNode(std::size_t node, T_SOLVER_REASON reason)
 {
     T_SOLVER_ERROR error = Bad(std::move(reason));
     error.node = static_cast<long>(node);
     return error;
 }
-T_SOLVER_ERROR BadElement(std::size_t element, std::string reason)
+T_SOLVER_ERROR BadElement(std::size_t element, T_SOLVER_REASON reason)
 {
     T_SOLVER_ERROR error = Bad(std::move(reason));
     error.element = static_cast<long>(element);
@@ -65,44 +64,40 @@ T_FAULT CheckNodes(const T_FRAME& frame)
 {
     for (std::size_t n = 0; n < frame.nodes.size(); ++n) {
         const T_NODE& node = frame.nodes[n];
-        if (!Finite(node.xyz)) return BadNode(n, "a coordinate is not a finite number");
-        if (!NotNegative(node.mass)) return BadNode(n, "a mass is negative or not finite");
+        if (!Finite(node.xyz)) return BadNode(n, "IDS_QM_ENGINE_COORDINATE");
+        if (!NotNegative(node.mass)) return BadNode(n, "IDS_QM_ENGINE_MASS");
     }
     return {};
 }
 
 /// What a beam or truss needs of its material and section; empty if all is there.
-std::string SectionFault(const T_FRAME& frame, const T_ELEMENT& element)
+T_SOLVER_REASON SectionFault(const T_FRAME& frame, const T_ELEMENT& element)
 {
-    if (element.material >= frame.materials.size()) return "the material is missing";
-    if (element.section >= frame.sections.size()) return "the section is missing";
+    if (element.material >= frame.materials.size()) return "IDS_QM_ENGINE_NO_MATERIAL";
+    if (element.section >= frame.sections.size()) return "IDS_QM_ENGINE_NO_SECTION";
     const T_MATERIAL& m = frame.materials[element.material];
     const T_SECTION& s = frame.sections[element.section];
-    if (!(std::isfinite(m.E) && m.E > 0.0)) return "the modulus E of its material is not positive";
-    if (!NotNegative(std::array{m.G, m.density}))
-        return "the modulus G or the density of its material is negative or not finite";
-    if (!std::isfinite(m.alpha)) return "the thermal expansion of its material is not finite";
-    if (!(std::isfinite(s.A) && s.A > 0.0)) return "the area A of its section is not positive";
-    if (!NotNegative(std::array{s.Asy, s.Asz}))
-        return "a shear area of its section is negative or not finite";
-    if (!NotNegative(std::array{s.J, s.Iy, s.Iz}))
-        return "a second moment of its section is negative or not finite";
+    if (!(std::isfinite(m.E) && m.E > 0.0)) return "IDS_QM_ENGINE_MODULUS_E";
+    if (!NotNegative(std::array{m.G, m.density})) return "IDS_QM_ENGINE_MODULUS_G";
+    if (!std::isfinite(m.alpha)) return "IDS_QM_ENGINE_EXPANSION";
+    if (!(std::isfinite(s.A) && s.A > 0.0)) return "IDS_QM_ENGINE_AREA";
+    if (!NotNegative(std::array{s.Asy, s.Asz})) return "IDS_QM_ENGINE_SHEAR_AREA";
+    if (!NotNegative(std::array{s.J, s.Iy, s.Iz})) return "IDS_QM_ENGINE_INERTIA";
     if (element.kind == ELEMENT_KIND::Beam && m.G == 0.0 && (s.J > 0.0 || s.Asy + s.Asz > 0.0))
-        return "the modulus G of its material is 0, but torsion or shear deformation needs it";
+        return "IDS_QM_ENGINE_NEEDS_G";
     return {};
 }
 
-std::string ShapeFault(const T_FRAME& frame, const T_ELEMENT& element)
+T_SOLVER_REASON ShapeFault(const T_FRAME& frame, const T_ELEMENT& element)
 {
     if (!Finite(element.zAxis) || !Finite(element.offsetI) || !Finite(element.offsetJ))
-        return "a reference vector or an offset is not finite";
+        return "IDS_QM_ENGINE_REFERENCE";
     const bool extras = !AllZero(element.offsetI) || !AllZero(element.offsetJ) ||
                         AnyTrue(element.releaseI) || AnyTrue(element.releaseJ);
-    if (extras && element.kind != ELEMENT_KIND::Beam)
-        return "releases and offsets belong to beams alone";
+    if (extras && element.kind != ELEMENT_KIND::Beam) return "IDS_QM_ENGINE_BEAMS_ALONE";
     if (!HasSection(element)) {
-        if (!NotNegative(element.stiffness)) return "a stiffness is negative or not finite";
-        return AllZero(element.stiffness) ? "all its stiffnesses are 0" : "";
+        if (!NotNegative(element.stiffness)) return "IDS_QM_ENGINE_STIFFNESS";
+        return AllZero(element.stiffness) ? "IDS_QM_ENGINE_NO_STIFFNESS" : "";
     }
     T_AXES axes;
     double length = 0.0;
@@ -110,8 +105,8 @@ std::string ShapeFault(const T_FRAME& frame, const T_ELEMENT& element)
     const T_ELEMENT plain{element.kind, element.i,       element.j,       0, 0, {}, {},
                           {},           element.offsetI, element.offsetJ, {}};
     if (element.kind == ELEMENT_KIND::Truss && BeamAxes(frame, plain, axes, length)) return {};
-    return BeamAxes(frame, plain, axes, length) ? "its reference vector is parallel to it"
-                                                : "zero length";
+    return BeamAxes(frame, plain, axes, length) ? "IDS_QM_ENGINE_PARALLEL"
+                                                : "IDS_QM_ENGINE_ZERO_LENGTH";
 }
 
 T_FAULT CheckReleases(const T_FRAME& frame, std::size_t e)
@@ -120,9 +115,8 @@ T_FAULT CheckReleases(const T_FRAME& frame, std::size_t e)
     if (!AnyTrue(element.releaseI) && !AnyTrue(element.releaseJ)) return {};
     const int loose = CBeamElement(frame, element).Loose();
     if (loose < 0) return {};
-    T_SOLVER_ERROR error = BadElement(e, "its releases let the beam move between its nodes along ");
-    if (loose % 6 >= 3) error.reason = "its releases let the beam turn between its nodes about ";
-    error.reason += FormatText("local %c", "xyz"[loose % 3]);
+    const char* const key = loose % 6 < 3 ? "IDS_QM_ENGINE_LOOSE_MOVE" : "IDS_QM_ENGINE_LOOSE_TURN";
+    T_SOLVER_ERROR error = BadElement(e, {key, {std::string(1, "xyz"[loose % 3])}});
     error.fault = SOLVER_FAULT::Mechanism;
     error.direction = loose % 6;
     return error;
@@ -146,8 +140,7 @@ T_FAULT CheckDuplicates(const T_FRAME& frame)
                         turned ? el.offsetJ : el.offsetI,
                         turned ? el.offsetI : el.offsetJ,
                         section ? T_VEC6{} : el.stiffness};
-        if (!seen.insert(key).second)
-            return BadElement(e, "another element of the same kind and properties joins its nodes");
+        if (!seen.insert(key).second) return BadElement(e, "IDS_QM_ENGINE_TWICE");
     }
     return {};
 }
@@ -158,9 +151,10 @@ T_FAULT CheckElements(const T_FRAME& frame)
         const T_ELEMENT& element = frame.elements[e];
         const bool one = element.kind == ELEMENT_KIND::Spring;
         if (element.i >= frame.nodes.size() || (!one && element.j >= frame.nodes.size()))
-            return BadElement(e, "a node of it is missing");
-        if (!one && element.i == element.j) return BadElement(e, "both its ends are the same node");
-        std::string reason = HasSection(element) ? SectionFault(frame, element) : "";
+            return BadElement(e, "IDS_QM_ENGINE_NO_NODE");
+        if (!one && element.i == element.j) return BadElement(e, "IDS_QM_ENGINE_ONE_NODE");
+        T_SOLVER_REASON reason;
+        if (HasSection(element)) reason = SectionFault(frame, element);
         if (reason.empty()) reason = ShapeFault(frame, element);
         if (!reason.empty()) return BadElement(e, reason);
         if (T_FAULT fault = CheckReleases(frame, e)) return fault;
@@ -175,25 +169,24 @@ T_FAULT CheckTies(const T_FRAME& frame)
                            [&](std::size_t n) { return n >= frame.nodes.size(); });
     };
     for (const T_DIAPHRAGM& d : frame.diaphragms) {
-        if (missing(d.nodes)) return Bad("a node of a rigid diaphragm is missing");
-        if (d.normal < 0 || d.normal > 2) return Bad("the normal of a rigid diaphragm is unknown");
+        if (missing(d.nodes)) return Bad("IDS_QM_ENGINE_DIAPHRAGM_NODE");
+        if (d.normal < 0 || d.normal > 2) return Bad("IDS_QM_ENGINE_DIAPHRAGM_NORMAL");
     }
     for (const T_EQUAL_DISPLACEMENT& d : frame.equalDisplacements)
-        if (missing(d.nodes)) return Bad("a node of equal displacements is missing");
+        if (missing(d.nodes)) return Bad("IDS_QM_ENGINE_EQUAL_NODE");
     return {};
 }
 
 // ---- load cases ---------------------------------------------------------------------------------
 
-constexpr const char* kNotFinite = "a load is not a finite number";
+constexpr const char* kNotFinite = "IDS_QM_ENGINE_LOAD_NOT_FINITE";
 
 /// A load on a direction that nothing holds, of a node.
 T_FAULT CheckHeld(const CFrameDofs& dofs, std::size_t node, const T_VEC6& load)
 {
     for (std::size_t d = 0; d < 6; ++d) {
         if (load[d] == 0.0 || !dofs.Inactive(6 * node + d)) continue;
-        T_SOLVER_ERROR error = BadNode(
-            node, FormatText("loaded in %s, where no element gives stiffness", DirectionName(d)));
+        T_SOLVER_ERROR error = BadNode(node, {"IDS_QM_ENGINE_LOAD_UNHELD", {DirectionName(d)}});
         error.direction = static_cast<int>(d);
         return error;
     }
@@ -203,45 +196,46 @@ T_FAULT CheckHeld(const CFrameDofs& dofs, std::size_t node, const T_VEC6& load)
 T_FAULT CheckNodal(const T_FRAME& frame, const CFrameDofs& dofs, const T_LOAD_CASE& load)
 {
     for (const T_NODAL_LOAD& l : load.nodal) {
-        if (l.node >= frame.nodes.size()) return BadNode(l.node, "load on a missing node");
+        if (l.node >= frame.nodes.size()) return BadNode(l.node, "IDS_QM_ENGINE_LOAD_NO_NODE");
         if (!Finite(l.load)) return BadNode(l.node, kNotFinite);
         if (T_FAULT fault = CheckHeld(dofs, l.node, l.load)) return fault;
     }
     return {};
 }
 
-std::string BeamLoadFault(const T_FRAME& frame, const T_BEAM_LOAD& l)
+T_SOLVER_REASON BeamLoadFault(const T_FRAME& frame, const T_BEAM_LOAD& l)
 {
-    if (l.element >= frame.elements.size()) return "load on a missing element";
+    if (l.element >= frame.elements.size()) return "IDS_QM_ENGINE_LOAD_NO_ELEMENT";
     const ELEMENT_KIND kind = frame.elements[l.element].kind;
-    if (!HasSection(frame.elements[l.element])) return "a link or spring takes no load";
-    if (l.direction < 0 || l.direction > 2) return "the direction of a load is unknown";
+    if (!HasSection(frame.elements[l.element])) return "IDS_QM_ENGINE_LOAD_ON_LINK";
+    if (l.direction < 0 || l.direction > 2) return "IDS_QM_ENGINE_LOAD_DIRECTION";
     if (!Finite(l.w) || !Finite(l.at)) return kNotFinite;
     const bool distributed = l.type == BEAM_LOAD::Distributed;
     if (!(l.at[0] >= 0.0 && l.at[0] <= 1.0 && (!distributed || l.at[1] <= 1.0)))
-        return "a load lies outside the beam";
-    if (distributed && !(l.at[1] > l.at[0])) return "a distributed load ends where it begins";
-    if (kind == ELEMENT_KIND::Truss && l.local) return "a truss takes no load along local axes";
+        return "IDS_QM_ENGINE_LOAD_OUTSIDE";
+    if (distributed && !(l.at[1] > l.at[0])) return "IDS_QM_ENGINE_LOAD_NO_EXTENT";
+    if (kind == ELEMENT_KIND::Truss && l.local) return "IDS_QM_ENGINE_TRUSS_LOCAL";
     if (kind == ELEMENT_KIND::Truss && l.type == BEAM_LOAD::Moment)
-        return "a truss takes no moment";
+        return "IDS_QM_ENGINE_TRUSS_MOMENT";
     return {};
 }
 
 T_FAULT CheckElementLoads(const T_FRAME& frame, const T_LOAD_CASE& load)
 {
     for (const T_BEAM_LOAD& l : load.beam)
-        if (std::string reason = BeamLoadFault(frame, l); !reason.empty())
+        if (T_SOLVER_REASON reason = BeamLoadFault(frame, l); !reason.empty())
             return BadElement(l.element, reason);
-    const auto check = [&](std::size_t e, double value, const char* what) -> T_FAULT {
-        if (e >= frame.elements.size()) return BadElement(e, "load on a missing element");
+    const auto check = [&](std::size_t e, double value, const char* refusal) -> T_FAULT {
+        if (e >= frame.elements.size()) return BadElement(e, "IDS_QM_ENGINE_LOAD_NO_ELEMENT");
         if (!std::isfinite(value)) return BadElement(e, kNotFinite);
         if (HasSection(frame.elements[e])) return {};
-        return BadElement(e, FormatText("a link or spring takes no %s", what));
+        return BadElement(e, refusal);
     };
     for (const T_TEMPERATURE& t : load.temperature)
-        if (T_FAULT fault = check(t.element, t.change, "temperature")) return fault;
+        if (T_FAULT fault = check(t.element, t.change, "IDS_QM_ENGINE_LINK_TEMPERATURE"))
+            return fault;
     for (const T_PRETENSION& t : load.pretension)
-        if (T_FAULT fault = check(t.element, t.force, "initial tension")) return fault;
+        if (T_FAULT fault = check(t.element, t.force, "IDS_QM_ENGINE_LINK_TENSION")) return fault;
     return {};
 }
 
@@ -249,13 +243,14 @@ T_FAULT CheckSettlements(const T_FRAME& frame, const CFrameDofs& dofs, const T_L
 {
     std::vector<double> given(dofs.FullCount(), 0.0);
     for (const T_SETTLEMENT& s : load.settlement) {
-        if (s.node >= frame.nodes.size()) return BadNode(s.node, "settlement of a missing node");
-        if (!Finite(s.displacement)) return BadNode(s.node, "a settlement is not a finite number");
+        if (s.node >= frame.nodes.size())
+            return BadNode(s.node, "IDS_QM_ENGINE_SETTLEMENT_NO_NODE");
+        if (!Finite(s.displacement)) return BadNode(s.node, "IDS_QM_ENGINE_SETTLEMENT_NOT_FINITE");
         for (std::size_t d = 0; d < 6; ++d) {
             given[6 * s.node + d] += s.displacement[d];
             if (s.displacement[d] == 0.0 || frame.nodes[s.node].fixed[d]) continue;
-            T_SOLVER_ERROR error = BadNode(
-                s.node, FormatText("settlement in %s, which is not restrained", DirectionName(d)));
+            T_SOLVER_ERROR error =
+                BadNode(s.node, {"IDS_QM_ENGINE_SETTLEMENT_FREE", {DirectionName(d)}});
             error.direction = static_cast<int>(d);
             return error;
         }
@@ -270,7 +265,7 @@ T_FAULT CheckSettlements(const T_FRAME& frame, const CFrameDofs& dofs, const T_L
         }
         if (std::fabs(sum) > kAgree * largest)
             return BadNode(static_cast<std::size_t>(demand[0].index) / 6,
-                           "settlements that the diaphragms or equal displacements forbid");
+                           "IDS_QM_ENGINE_SETTLEMENT_FORBIDDEN");
     }
     return {};
 }
@@ -279,10 +274,9 @@ T_FAULT CheckSettlements(const T_FRAME& frame, const CFrameDofs& dofs, const T_L
 
 std::optional<T_SOLVER_ERROR> CheckModel(const T_FRAME& frame)
 {
-    if (frame.nodes.empty() || frame.elements.empty())
-        return Bad("the model has no nodes or no elements");
+    if (frame.nodes.empty() || frame.elements.empty()) return Bad("IDS_QM_ENGINE_NO_NODES");
     if (!(std::isfinite(frame.gravity) && frame.gravity >= 0.0))
-        return Bad("the gravity is negative or not finite");
+        return Bad("IDS_QM_ENGINE_GRAVITY");
     for (const auto& check : {CheckNodes, CheckElements, CheckTies})
         if (T_FAULT fault = check(frame)) return fault;
     return {};

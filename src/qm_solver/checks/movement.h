@@ -7,8 +7,10 @@
 
 namespace solver {
 
-inline constexpr std::array<const char*, 6> kMotionName{
-    "move along X", "move along Y", "move along Z", "turn about X", "turn about Y", "turn about Z"};
+/// Keys of what a node is free to do, by direction.
+inline constexpr std::array<const char*, 6> kMotionKeys{
+    "IDS_QM_ENGINE_MOVE_X", "IDS_QM_ENGINE_MOVE_Y", "IDS_QM_ENGINE_MOVE_Z",
+    "IDS_QM_ENGINE_TURN_X", "IDS_QM_ENGINE_TURN_Y", "IDS_QM_ENGINE_TURN_Z"};
 
 /// Full index (6 * node + direction) of the largest translation of a shape, or of the largest
 /// rotation where translations are nothing beside it. The first of equal ones. Shape not empty.

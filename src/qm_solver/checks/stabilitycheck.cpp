@@ -229,14 +229,20 @@ Vector3d TranslationOf(const Vector3d& axis, const MatrixXd& motions, const Matr
     return move - moves * (moves.transpose() * move);
 }
 
-std::string TurnWords(const T_FREE_AXIS& free, const Vector3d& move, const T_PART& part)
+/// What the part is free to do along or about an axis: `first` is the direction of axis X, `other`
+/// the key for an inclined one.
+T_SOLVER_REASON MotionWords(const T_FREE_AXIS& free, std::size_t first, const char* other)
 {
-    std::string words = free.direction >= 0
-                            ? std::string(kMotionName[3 + static_cast<std::size_t>(free.direction)])
-                            : "turn about the direction " + Triple(free.axis);
-    if (move.norm() < kAxisTolerance) return words + " (axis through its centre)";
+    if (free.direction < 0) return {other, {Triple(free.axis)}};
+    return kMotionKeys[first + static_cast<std::size_t>(free.direction)];
+}
+
+T_SOLVER_REASON TurnWords(const T_FREE_AXIS& free, const Vector3d& move, const T_PART& part)
+{
+    const T_SOLVER_REASON words = MotionWords(free, 3, "IDS_QM_ENGINE_TURN_ABOUT");
+    if (move.norm() < kAxisTolerance) return {"IDS_QM_ENGINE_AXIS_CENTRE", {words}};
     const Vector3d through = part.centre + part.size * free.axis.cross(move);
-    return words + " (axis through " + Triple(through) + ")";
+    return {"IDS_QM_ENGINE_AXIS_THROUGH", {words, Triple(through)}};
 }
 
 T_SOLVER_ERROR Describe(T_PART& part, const MatrixXd& motions)
@@ -250,20 +256,21 @@ T_SOLVER_ERROR Describe(T_PART& part, const MatrixXd& motions)
     T_SOLVER_ERROR error;
     error.fault = SOLVER_FAULT::Mechanism;
     error.node = static_cast<long>(part.nodes.front());
-    std::vector<std::string> words;
-    const auto name = [&](int direction, std::string text) {
+    std::vector<T_SOLVER_REASON> words;
+    const auto name = [&](int direction, T_SOLVER_REASON motion) {
         if (words.empty()) error.direction = direction;
-        words.push_back(std::move(text));
+        words.push_back(std::move(motion));
     };
     for (const T_FREE_AXIS& a : Axes(moves))
-        name(a.direction, a.direction >= 0 ? kMotionName[static_cast<std::size_t>(a.direction)]
-                                           : "move along the direction " + Triple(a.axis));
+        name(a.direction, MotionWords(a, 0, "IDS_QM_ENGINE_MOVE_ALONG"));
     for (const T_FREE_AXIS& a : Axes(Basis(motions.bottomRows(3))))
         name(a.direction >= 0 ? 3 + a.direction : -1,
              TurnWords(a, TranslationOf(a.axis, motions, moves), part));
-    error.reason = "the part is free to " + words[0];
+    T_SOLVER_REASON all = words[0];
     for (std::size_t i = 1; i < words.size(); ++i)
-        error.reason += (i + 1 < words.size() ? ", to " : " and to ") + words[i];
+        all = {i + 1 < words.size() ? "IDS_QM_ENGINE_LIST_NEXT" : "IDS_QM_ENGINE_LIST_LAST",
+               {all, words[i]}};
+    error.reason = {"IDS_QM_ENGINE_PART_FREE", {all}};
     error.part = std::move(part.nodes);
     return error;
 }

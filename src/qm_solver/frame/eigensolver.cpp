@@ -29,12 +29,12 @@ constexpr double kGap = 1.0e-5; // relative gap of eigenvalues in which a shift 
 /// A fault on its way out of the iteration; caught in this file.
 struct T_STOP : std::exception {
     T_SOLVER_ERROR error;
-    T_STOP(SOLVER_FAULT fault, std::string reason)
+    T_STOP(SOLVER_FAULT fault, T_SOLVER_REASON reason)
     {
         error.fault = fault;
         error.reason = std::move(reason);
     }
-    const char* what() const noexcept override { return error.reason.c_str(); }
+    const char* what() const noexcept override { return error.reason.key.c_str(); }
 };
 
 std::size_t Count(Index i)
@@ -76,7 +76,7 @@ public:
             for (Index c = 0; c < width; ++c)
                 m_problem.root.Apply({y.col(first + c).data(), Count(y.rows())},
                                      side.subspan(n * Count(c), n));
-            std::string reason;
+            T_SOLVER_REASON reason;
             if (!m_problem.factor.Solve(side, Count(width), reason))
                 throw T_STOP(SOLVER_FAULT::Failed, reason);
             Report(Count(width));
@@ -106,7 +106,7 @@ private:
     {
         m_done = std::min(m_done + solved, m_total);
         if (m_progress && !m_progress(m_done, m_total))
-            throw T_STOP(SOLVER_FAULT::Cancelled, "cancelled");
+            throw T_STOP(SOLVER_FAULT::Cancelled, "IDS_QM_ENGINE_CANCELLED");
     }
     const T_EIGEN_PROBLEM& m_problem;
     const ProgressFn& m_progress;
@@ -146,7 +146,7 @@ T_SPECTRUM Lanczos(CInverse& inverse, std::size_t wanted, unsigned seed)
     lanczos.compute(Spectra::SortRule::LargestAlge, kMaxRestarts, kTolerance,
                     Spectra::SortRule::LargestAlge);
     if (lanczos.info() != Spectra::CompInfo::Successful)
-        throw T_STOP(SOLVER_FAULT::NotConverged, "the modes did not converge");
+        throw T_STOP(SOLVER_FAULT::NotConverged, "IDS_QM_ENGINE_MODES_DIVERGE");
     return {lanczos.eigenvalues(), lanczos.eigenvectors()};
 }
 
@@ -223,7 +223,7 @@ std::size_t CountBelow(const T_EIGEN_PROBLEM& problem, double sigma)
 {
     const T_SYMMETRIC_MATRIX shifted = Shifted(problem.stiffness, problem.root.Mass(), sigma);
     CSparseFactor factor;
-    std::string reason;
+    T_SOLVER_REASON reason;
     if (!factor.Analyse(shifted, problem.block, reason) || !factor.Factor(shifted, reason))
         throw T_STOP(SOLVER_FAULT::Failed, reason);
     return factor.Info().negativePivots;
@@ -240,8 +240,7 @@ T_SPECTRUM LanczosSpectrum(const T_EIGEN_PROBLEM& problem, CInverse& inverse, st
         inverse.Deflate(known);
         Merge(known, Lanczos(inverse, below - cut.below + 1, 2 + static_cast<unsigned>(round)));
     }
-    throw T_STOP(SOLVER_FAULT::NotConverged,
-                 "the modes found are not all there are in their range");
+    throw T_STOP(SOLVER_FAULT::NotConverged, "IDS_QM_ENGINE_MODES_MISSED");
 }
 
 /// Shapes x = K^-1 L y of unit modal mass, and their Rayleigh quotients.
@@ -263,7 +262,7 @@ void Solve(const T_EIGEN_PROBLEM& problem, std::size_t count, T_EIGENPAIRS& out,
            const ProgressFn& progress)
 {
     const std::size_t rank = problem.root.Rank();
-    if (rank == 0) throw T_STOP(SOLVER_FAULT::NoMass, "the model has no mass that can move");
+    if (rank == 0) throw T_STOP(SOLVER_FAULT::NoMass, "IDS_QM_ENGINE_NO_MASS");
     count = std::min(count, rank);
     if (count == 0) return;
     const bool dense = rank <= kDenseRank || kDenseShare * (count + kGuard) > rank;

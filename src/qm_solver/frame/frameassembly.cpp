@@ -106,12 +106,12 @@ private:
     std::vector<int> m_neighbour, m_offset, m_rowStart;
 };
 
-int CFrameAssembly::Prepare(const T_FRAME& frame, const CFrameDofs& dofs, std::string& reason)
+int CFrameAssembly::Prepare(const T_FRAME& frame, const CFrameDofs& dofs, T_SOLVER_REASON& reason)
 {
     ListParts(frame, dofs);
     CPattern pattern(dofs.Blocks(), m_unknowns, m_listFrom);
     if (!pattern.Fill(m_matrix)) {
-        reason = "the matrix has more entries than can be counted";
+        reason = "IDS_QM_ENGINE_TOO_MANY_ENTRIES";
         return 0;
     }
     MakePlaces(pattern);

@@ -3,6 +3,7 @@
 
 #include "qm_solver/element/elementstiffness.h"
 #include "qm_solver/frame/framedofs.h"
+#include "qm_solver/solverreason.h"
 #include "qm_solver/sparse/sparsefactor.h"
 
 #include <cstdint>
@@ -19,7 +20,8 @@ class CFrameAssembly {
 public:
     /// Pattern and places. Frame and map are used again by Assemble with the same topology.
     /// 1 done; 0 `reason` filled: the matrix has more entries than can be counted.
-    [[nodiscard]] int Prepare(const T_FRAME& frame, const CFrameDofs& dofs, std::string& reason);
+    [[nodiscard]] int Prepare(const T_FRAME& frame, const CFrameDofs& dofs,
+                              T_SOLVER_REASON& reason);
     /// Values of the matrix from the elements' stiffness; axial by element, empty: first order.
     void Assemble(const T_FRAME& frame, std::span<const T_AXIAL> axial = {});
     const T_SYMMETRIC_MATRIX& Matrix() const { return m_matrix; }

@@ -1,6 +1,5 @@
 #include "qm_solver/sparse/mumps.h"
 
-#include "qm_base/textformat.h"
 #include "qm_solver/sparse/librarylock.h"
 
 #include <algorithm>
@@ -19,23 +18,23 @@ constexpr std::size_t kIntMax = std::numeric_limits<int>::max();
 
 struct T_ERROR_WORDS {
     int code;
-    const char* words;
+    const char* key;
 };
 
 constexpr std::array<T_ERROR_WORDS, 13> kErrors{{
-    {-5, "not enough memory to analyse the matrix"},
-    {-6, "the matrix is singular in structure"},
-    {-7, "not enough memory to analyse the matrix"},
-    {-8, "the factorisation ran out of work space"},
-    {-9, "the factorisation ran out of work space"},
-    {-10, "the matrix is singular"},
-    {-11, "the factorisation ran out of work space"},
-    {-13, "not enough memory to factorise the matrix"},
-    {-14, "the solution ran out of work space"},
-    {-16, "the number of equations is out of range"},
-    {-19, "the memory limit of the factorisation is too small"},
-    {-51, "the matrix is too large for the ordering"},
-    {-52, "the matrix is too large for the ordering"},
+    {-5, "IDS_QM_ENGINE_ANALYSE_MEMORY"},
+    {-6, "IDS_QM_ENGINE_SINGULAR_PATTERN"},
+    {-7, "IDS_QM_ENGINE_ANALYSE_MEMORY"},
+    {-8, "IDS_QM_ENGINE_FACTOR_SPACE"},
+    {-9, "IDS_QM_ENGINE_FACTOR_SPACE"},
+    {-10, "IDS_QM_ENGINE_SINGULAR"},
+    {-11, "IDS_QM_ENGINE_FACTOR_SPACE"},
+    {-13, "IDS_QM_ENGINE_FACTOR_MEMORY"},
+    {-14, "IDS_QM_ENGINE_SOLVE_SPACE"},
+    {-16, "IDS_QM_ENGINE_EQUATIONS"},
+    {-19, "IDS_QM_ENGINE_MEMORY_LIMIT"},
+    {-51, "IDS_QM_ENGINE_TOO_LARGE"},
+    {-52, "IDS_QM_ENGINE_TOO_LARGE"},
 }};
 
 double Count(double raw)
@@ -75,13 +74,13 @@ int CMumps::Run(int job)
     return m_id.infog[0];
 }
 
-std::string CMumps::Words() const
+T_SOLVER_REASON CMumps::Words() const
 {
     const int code = Global(1);
     const auto row =
         std::find_if(kErrors.begin(), kErrors.end(), [&](const auto& r) { return r.code == code; });
-    const char* words = row == kErrors.end() ? "the sparse solver failed" : row->words;
-    return FormatText("%s (MUMPS %d, %d)", words, code, Global(2));
+    const char* key = row == kErrors.end() ? "IDS_QM_ENGINE_SPARSE_FAILED" : row->key;
+    return {"IDS_QM_ENGINE_SPARSE_CODE", {key, std::to_string(code), std::to_string(Global(2))}};
 }
 
 double CMumps::GlobalCount(int i) const

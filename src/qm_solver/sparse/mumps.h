@@ -1,8 +1,9 @@
 // The sparse direct solver as an object, its calls one at a time.
 #pragma once
 
+#include "qm_solver/solverreason.h"
+
 #include <cstddef>
-#include <string>
 
 #include <dmumps_c.h>
 
@@ -28,7 +29,7 @@ public:
     /// Runs a phase and returns INFOG(1).
     int Run(int job);
     /// Why the last phase failed.
-    std::string Words() const;
+    T_SOLVER_REASON Words() const;
     DMUMPS_STRUC_C& Id() { return m_id; }
     int& Control(int i) { return m_id.icntl[i - 1]; } // numbered as in the library's guide
     int Global(int i) const { return m_id.infog[i - 1]; }

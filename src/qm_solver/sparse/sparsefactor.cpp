@@ -1,6 +1,5 @@
 #include "qm_solver/sparse/sparsefactor.h"
 
-#include "qm_base/textformat.h"
 #include "qm_solver/sparse/equationorder.h"
 #include "qm_solver/sparse/mumps.h"
 
@@ -71,21 +70,21 @@ struct CSparseFactor::T_STATE {
     T_FACTOR_INFO info;
     std::shared_ptr<CFactorSpace> space;
 
-    int Fail(std::string& reason) const
+    int Fail(T_SOLVER_REASON& reason) const
     {
         reason = mumps->Words();
         return 0;
     }
     void Take(const T_SYMMETRIC_MATRIX& matrix);
-    int Analyse(std::string& reason);
-    int Factor(const T_SYMMETRIC_MATRIX& matrix, PIVOTS pivots, std::string& reason);
+    int Analyse(T_SOLVER_REASON& reason);
+    int Factor(const T_SYMMETRIC_MATRIX& matrix, PIVOTS pivots, T_SOLVER_REASON& reason);
     int RunFactor();
     std::size_t SpaceFor(double slack) const
     {
         return static_cast<std::size_t>(mumps->SpaceEstimate() * slack) + kLeastSpace;
     }
     bool InSpace() const { return !space || space->m_space->user == this; }
-    int Solve(std::span<double> rhs, std::size_t count, std::string& reason);
+    int Solve(std::span<double> rhs, std::size_t count, T_SOLVER_REASON& reason);
     void ReadInfo();
 };
 
@@ -101,7 +100,7 @@ void CSparseFactor::T_STATE::Take(const T_SYMMETRIC_MATRIX& matrix)
         }
 }
 
-int CSparseFactor::T_STATE::Analyse(std::string& reason)
+int CSparseFactor::T_STATE::Analyse(T_SOLVER_REASON& reason)
 {
     mumps = std::make_unique<CMumps>();
     if (mumps->Global(1) < 0) return Fail(reason);
@@ -113,8 +112,7 @@ int CSparseFactor::T_STATE::Analyse(std::string& reason)
     id.perm_in = order.data();
     if (mumps->Run(CMumps::kAnalyse) < 0) return Fail(reason);
     if (mumps->Global(7) != CMumps::kGivenOrder) {
-        reason = FormatText("the sparse solver took ordering %d in place of the given one",
-                            mumps->Global(7));
+        reason = {"IDS_QM_ENGINE_ORDERING", {std::to_string(mumps->Global(7))}};
         return 0;
     }
     if (space) space->m_space->wanted = std::max(space->m_space->wanted, SpaceFor(1.0));
@@ -123,7 +121,7 @@ int CSparseFactor::T_STATE::Analyse(std::string& reason)
 }
 
 int CSparseFactor::T_STATE::Factor(const T_SYMMETRIC_MATRIX& matrix, PIVOTS pivots,
-                                   std::string& reason)
+                                   T_SOLVER_REASON& reason)
 {
     // The library reads the values and does not write them.
     mumps->Id().a = const_cast<double*>(matrix.value.data());
@@ -171,7 +169,7 @@ void CSparseFactor::T_STATE::ReadInfo()
     std::sort(info.nullPivots.begin(), info.nullPivots.end());
 }
 
-int CSparseFactor::T_STATE::Solve(std::span<double> rhs, std::size_t count, std::string& reason)
+int CSparseFactor::T_STATE::Solve(std::span<double> rhs, std::size_t count, T_SOLVER_REASON& reason)
 {
     DMUMPS_STRUC_C& id = mumps->Id();
     id.lrhs = static_cast<int>(n);
@@ -182,7 +180,7 @@ int CSparseFactor::T_STATE::Solve(std::span<double> rhs, std::size_t count, std:
     }
     id.rhs = nullptr;
     if (AllFinite(rhs)) return 1;
-    reason = "the solution overflows";
+    reason = "IDS_QM_ENGINE_OVERFLOW";
     return 0;
 }
 
@@ -192,13 +190,13 @@ CSparseFactor::CSparseFactor(CSparseFactor&&) noexcept = default;
 CSparseFactor& CSparseFactor::operator=(CSparseFactor&&) noexcept = default;
 
 int CSparseFactor::Analyse(const T_SYMMETRIC_MATRIX& matrix, std::span<const int> block,
-                           std::string& reason, std::shared_ptr<CFactorSpace> space)
+                           T_SOLVER_REASON& reason, std::shared_ptr<CFactorSpace> space)
 try {
     m_state.reset();
     const std::size_t n = matrix.Size();
     if (n > static_cast<std::size_t>(std::numeric_limits<int>::max()) || !PatternIsValid(matrix) ||
         !BlocksAreValid(block, n)) {
-        reason = "the pattern of the matrix is not an upper triangle by rows";
+        reason = "IDS_QM_ENGINE_NOT_TRIANGLE";
         return 0;
     }
     auto state = std::make_unique<T_STATE>();
@@ -212,34 +210,34 @@ try {
     m_state = std::move(state);
     return 1;
 } catch (const std::bad_alloc&) {
-    reason = "not enough memory to analyse the matrix";
+    reason = "IDS_QM_ENGINE_ANALYSE_MEMORY";
     return 0;
 }
 
-int CSparseFactor::Factor(const T_SYMMETRIC_MATRIX& matrix, std::string& reason, PIVOTS pivots)
+int CSparseFactor::Factor(const T_SYMMETRIC_MATRIX& matrix, T_SOLVER_REASON& reason, PIVOTS pivots)
 try {
     if (!m_state || !m_state->analysed || matrix.Size() != m_state->n ||
         matrix.value.size() != m_state->column.size()) {
-        reason = "the matrix is not the one that was analysed";
+        reason = "IDS_QM_ENGINE_OTHER_MATRIX";
         return 0;
     }
     m_state->factored = m_state->n == 0;
     m_state->info = {};
     if (!AllFinite(matrix.value)) {
-        reason = "the matrix holds a value that is no number";
+        reason = "IDS_QM_ENGINE_NOT_A_NUMBER";
         return 0;
     }
     return m_state->n == 0 ? 1 : m_state->Factor(matrix, pivots, reason);
 } catch (const std::bad_alloc&) {
-    reason = "not enough memory to factorise the matrix";
+    reason = "IDS_QM_ENGINE_FACTOR_MEMORY";
     return 0;
 }
 
-int CSparseFactor::Solve(std::span<double> rhs, std::size_t count, std::string& reason)
+int CSparseFactor::Solve(std::span<double> rhs, std::size_t count, T_SOLVER_REASON& reason)
 {
     if (!m_state || !m_state->factored || rhs.size() != m_state->n * count ||
         (m_state->n > 0 && !m_state->InSpace())) {
-        reason = "no factorisation of the right-hand sides' size";
+        reason = "IDS_QM_ENGINE_NO_FACTOR";
         return 0;
     }
     return m_state->n == 0 ? 1 : m_state->Solve(rhs, count, reason);

@@ -2,6 +2,7 @@
 // direct solver (MUMPS with a METIS ordering).
 #pragma once
 
+#include "qm_solver/solverreason.h"
 #include "qm_solver/sparse/symmetricmatrix.h"
 
 #include <cstddef>
@@ -50,14 +51,14 @@ public:
     /// space: where the factors go; empty: memory of their own.
     /// 1 done; 0 `reason` filled.
     [[nodiscard]] int Analyse(const T_SYMMETRIC_MATRIX& matrix, std::span<const int> block,
-                              std::string& reason, std::shared_ptr<CFactorSpace> space = {});
+                              T_SOLVER_REASON& reason, std::shared_ptr<CFactorSpace> space = {});
     /// Numeric phase; the pattern is that of Analyse. Watched pivots that vanish are no failure:
     /// they are listed in Info. 1 done; 0 `reason` filled.
-    [[nodiscard]] int Factor(const T_SYMMETRIC_MATRIX& matrix, std::string& reason,
+    [[nodiscard]] int Factor(const T_SYMMETRIC_MATRIX& matrix, T_SOLVER_REASON& reason,
                              PIVOTS pivots = PIVOTS::Watch);
     /// Solves for `count` right-hand sides, column after column, in place; blocks of up to 64.
     /// The unknown of a vanished pivot is set to 0. 1 done; 0 `reason` filled, rhs undefined.
-    [[nodiscard]] int Solve(std::span<double> rhs, std::size_t count, std::string& reason);
+    [[nodiscard]] int Solve(std::span<double> rhs, std::size_t count, T_SOLVER_REASON& reason);
     const T_FACTOR_INFO& Info() const;
 
 private:

@@ -19,7 +19,7 @@ constexpr std::size_t kMaxIterations = 50;
 constexpr double kConverged = 1e-12; // change of displacements and tensions over the largest
 constexpr double kRounding = 1e-9;   // below this a change that no longer shrinks is rounding
 
-T_SOLVER_ERROR Fault(SOLVER_FAULT fault, std::string reason)
+T_SOLVER_ERROR Fault(SOLVER_FAULT fault, T_SOLVER_REASON reason)
 {
     T_SOLVER_ERROR error;
     error.fault = fault;
@@ -68,7 +68,7 @@ CStagedRun::T_FAULT CStagedRun::Go(const ProgressFn& progress)
         for (std::size_t step = 0; step < m_plan.change[s].size() && !fault; ++step) {
             fault = Step(s, step);
             if (!fault && progress && !progress(++done, total))
-                fault = Fault(SOLVER_FAULT::Cancelled, "cancelled");
+                fault = Fault(SOLVER_FAULT::Cancelled, "IDS_QM_ENGINE_CANCELLED");
         }
         if (!fault) continue;
         fault->stage = static_cast<long>(s);
@@ -208,7 +208,7 @@ CStagedRun::T_FAULT CStagedRun::SolveBlock(std::span<const std::size_t> cases)
     const std::vector<double> sides = block.RightSides();
     std::vector<double> x = sides;
     const std::size_t n = part.Dofs().EquationCount();
-    std::string reason;
+    T_SOLVER_REASON reason;
     if (n > 0 && !part.Factor().Solve(x, cases.size(), reason))
         return Fault(SOLVER_FAULT::Failed, reason);
     for (std::size_t k = 0; k < cases.size() && n > 0; ++k)
@@ -276,9 +276,8 @@ CStagedRun::T_FAULT CStagedRun::Iterate()
         before = now;
     }
     return Fault(SOLVER_FAULT::NotConverged,
-                 FormatText("the axial forces did not converge in %zu iterations: they still "
-                            "changed by %.3g of the largest",
-                            kMaxIterations, last));
+                 {"IDS_QM_ENGINE_AXIAL_DIVERGES",
+                  {std::to_string(kMaxIterations), FormatText("%.3g", last)}});
 }
 
 /// Unstable where the stiffness with its axial forces has a negative eigenvalue.
@@ -287,15 +286,13 @@ CStagedRun::T_FAULT CStagedRun::CheckBuckling() const
     const CStagePart& part = Part();
     const T_FACTOR_INFO& info = m_parts[m_now.part]->Factor().Info();
     if (part.Dofs().EquationCount() > 0 && (info.negativePivots > 0 || !info.nullPivots.empty()))
-        return Fault(SOLVER_FAULT::Mechanism,
-                     "the structure is unstable under its axial forces: it buckles");
+        return Fault(SOLVER_FAULT::Mechanism, "IDS_QM_ENGINE_BUCKLES");
     for (std::size_t own = 0; own < part.Frame().elements.size(); ++own) {
         const T_ELEMENT& element = part.Frame().elements[own];
         const double tension = m_now.axial[own].tension;
         if (element.kind != ELEMENT_KIND::Beam || !(tension < 0.0)) continue;
         if (CBeamElement(part.Frame(), element, tension).Loose() < 0) continue;
-        T_SOLVER_ERROR error =
-            Fault(SOLVER_FAULT::Mechanism, "the beam buckles between its releases");
+        T_SOLVER_ERROR error = Fault(SOLVER_FAULT::Mechanism, "IDS_QM_ENGINE_BEAM_BUCKLES");
         error.element = static_cast<long>(part.Active().elements[own]);
         return error;
     }

@@ -13,7 +13,7 @@ namespace {
 
 using T_FAULT = std::optional<T_SOLVER_ERROR>;
 
-T_SOLVER_ERROR Failed(std::string reason)
+T_SOLVER_ERROR Failed(T_SOLVER_REASON reason)
 {
     T_SOLVER_ERROR error;
     error.fault = SOLVER_FAULT::Failed;
@@ -79,7 +79,7 @@ std::optional<T_SOLVER_ERROR> CStagePart::Prepare(std::shared_ptr<CFactorSpace> 
     if (!fault) fault = CheckRigidBodies(m_frame);
     if (fault) return InModel(fault, m_active);
     m_dofs.emplace(m_frame);
-    std::string reason;
+    T_SOLVER_REASON reason;
     if (!m_assembly.Prepare(m_frame, *m_dofs, reason)) return Failed(reason);
     if (!m_factor.Analyse(Matrix(), m_dofs->Blocks(), reason, std::move(space)))
         return Failed(reason);
@@ -103,7 +103,7 @@ std::optional<T_SOLVER_ERROR> CStagePart::Factorise(std::span<const T_AXIAL> axi
 std::optional<T_SOLVER_ERROR> CStagePart::Numeric(std::span<const T_AXIAL> axial, bool search)
 {
     if (m_dofs->EquationCount() == 0) return {}; // everything is held
-    std::string reason;
+    T_SOLVER_REASON reason;
     T_SOLVER_ERROR error;
     if (search) {
         if (!FactorStable(m_frame, *m_dofs, Matrix(), m_factor, error, axial)) return error;
@@ -126,21 +126,21 @@ std::optional<T_SOLVER_ERROR> CStagePart::CheckPlaces(const T_LOAD_CASE& load, b
 {
     const auto element = [&](std::size_t e, bool must) -> T_FAULT {
         if (e >= m_own.size())
-            return BadAt(&T_SOLVER_ERROR::element, e, "load on a missing element");
+            return BadAt(&T_SOLVER_ERROR::element, e, "IDS_QM_ENGINE_LOAD_NO_ELEMENT");
         if (Own(e) || !must) return {};
-        return BadAt(&T_SOLVER_ERROR::element, e, "load on an element that is not active");
+        return BadAt(&T_SOLVER_ERROR::element, e, "IDS_QM_ENGINE_INACTIVE_ELEMENT");
     };
     const auto node = [&](std::size_t n, const char* missing) -> T_FAULT {
         if (n < m_standing.size()) return {};
         return BadAt(&T_SOLVER_ERROR::node, n, missing);
     };
     for (const T_NODAL_LOAD& l : load.nodal) {
-        if (T_FAULT fault = node(l.node, "load on a missing node")) return fault;
+        if (T_FAULT fault = node(l.node, "IDS_QM_ENGINE_LOAD_NO_NODE")) return fault;
         if (!m_standing[l.node])
-            return BadAt(&T_SOLVER_ERROR::node, l.node, "load on a node that no element joins");
+            return BadAt(&T_SOLVER_ERROR::node, l.node, "IDS_QM_ENGINE_LONE_NODE");
     }
     for (const T_SETTLEMENT& l : load.settlement)
-        if (T_FAULT fault = node(l.node, "settlement of a missing node")) return fault;
+        if (T_FAULT fault = node(l.node, "IDS_QM_ENGINE_SETTLEMENT_NO_NODE")) return fault;
     for (const T_BEAM_LOAD& l : load.beam)
         if (T_FAULT fault = element(l.element, true)) return fault;
     for (const T_TEMPERATURE& l : load.temperature)

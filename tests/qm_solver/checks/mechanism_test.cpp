@@ -36,11 +36,11 @@ std::optional<std::vector<double>> MechanismOf(const std::vector<double>& spring
 {
     const T_SYMMETRIC_MATRIX k = Chain(spring);
     CSparseFactor factor;
-    std::string reason;
+    T_SOLVER_REASON reason;
     std::vector<int> block(k.Size());
     std::iota(block.begin(), block.end(), 0);
-    EXPECT_EQ(1, factor.Analyse(k, block, reason)) << reason;
-    EXPECT_EQ(1, factor.Factor(k, reason, pivots)) << reason;
+    EXPECT_EQ(1, factor.Analyse(k, block, reason)) << reason.Text();
+    EXPECT_EQ(1, factor.Factor(k, reason, pivots)) << reason.Text();
     alarms = factor.Info().nullPivots.size();
     const auto strainless = [&](std::span<const double> v) {
         double energy = 0.0, apart = 0.0;
@@ -52,7 +52,7 @@ std::optional<std::vector<double>> MechanismOf(const std::vector<double>& spring
         return energy <= 1e-20 * apart;
     };
     std::optional<std::vector<double>> shape;
-    EXPECT_EQ(1, FindMechanism(k, factor, strainless, shape, reason)) << reason;
+    EXPECT_EQ(1, FindMechanism(k, factor, strainless, shape, reason)) << reason.Text();
     return shape;
 }
 

@@ -86,10 +86,10 @@ TEST(Unstable, ModelsAreRefusedWithNodeAndDirection)
         CFrameSolver solver;
         T_SOLVER_ERROR error;
         ASSERT_EQ(0, solver.Prepare(c.frame, error));
-        EXPECT_EQ(SOLVER_FAULT::Mechanism, error.fault) << error.reason;
+        EXPECT_EQ(SOLVER_FAULT::Mechanism, error.fault) << error.reason.Text();
         EXPECT_EQ(1, std::count(c.nodes.begin(), c.nodes.end(), std::size_t(error.node)))
             << error.node;
-        EXPECT_EQ(c.direction, error.direction) << error.reason;
+        EXPECT_EQ(c.direction, error.direction) << error.reason.Text();
         EXPECT_TRUE(error.part.empty());
         std::vector<T_RESULT> results;
         EXPECT_EQ(0, solver.Solve(std::vector<T_LOAD_CASE>(1), results, error)); // no model held
@@ -115,12 +115,12 @@ TEST(Unstable, IsATowerOnAStoreyOfHingedColumns)
             CFrameSolver solver;
             T_SOLVER_ERROR error;
             ASSERT_EQ(0, solver.Prepare(frame, error));
-            EXPECT_EQ(SOLVER_FAULT::Mechanism, error.fault) << error.reason;
+            EXPECT_EQ(SOLVER_FAULT::Mechanism, error.fault) << error.reason.Text();
             EXPECT_GE(error.node, long(4 * (hinged + 1))); // above the hinges
             EXPECT_LE(error.direction, Z);
             for (std::size_t c = 0; c < 4; ++c) // hinges at one end are no mechanism
                 frame.elements[8 * hinged + 2 * c].releaseJ = {};
-            EXPECT_EQ(1, solver.Prepare(frame, error)) << error.reason;
+            EXPECT_EQ(1, solver.Prepare(frame, error)) << error.reason.Text();
         }
 }
 
@@ -133,7 +133,7 @@ TEST(Unstable, PartsAreRefusedBeforeTheFactorisation)
     T_SOLVER_ERROR error;
     ASSERT_EQ(0, solver.Prepare(frame, error));
     EXPECT_EQ("the part is free to move along Y and to turn about X (axis through its centre)",
-              error.reason);
+              error.reason.Text());
     EXPECT_EQ(4u, error.part.size());
     EXPECT_EQ(Y, error.direction);
 }
@@ -159,12 +159,12 @@ TEST(Unstable, IsNotWhatIsMerelyOfVeryDifferentStiffness)
         frame.elements[1].section = 1;
         CFrameSolver solver;
         T_SOLVER_ERROR error;
-        ASSERT_EQ(1, solver.Prepare(frame, error)) << error.reason;
+        ASSERT_EQ(1, solver.Prepare(frame, error)) << error.reason.Text();
         if (contrast > 1e8) continue; // accepted; whether figures keep their digits, Solve says
         T_LOAD_CASE push;
         push.nodal.push_back({1, {10.0, 0, 0, 0, 0, 0}});
         std::vector<T_RESULT> results;
-        ASSERT_EQ(1, solver.Solve(std::span(&push, 1), results, error)) << error.reason;
+        ASSERT_EQ(1, solver.Solve(std::span(&push, 1), results, error)) << error.reason.Text();
         // The girder's own flexibility is the rest: EI b / 12 against the columns, 1 / contrast.
         EXPECT_NEAR(sway, results[0].displacement[1][X], sway * (1.0 / contrast + 1e-6));
     }

@@ -20,12 +20,13 @@ T_EIGENPAIRS Pairs(const MatrixXd& k, const MatrixXd& m, std::size_t count)
     const std::vector<int> block = sample::Blocks(k.rows(), 1);
     const CMassRoot root(sample::Upper(m));
     CSparseFactor factor;
-    std::string reason;
+    T_SOLVER_REASON reason;
     T_EIGENPAIRS pairs;
     T_SOLVER_ERROR error;
-    EXPECT_EQ(1, factor.Analyse(stiffness, block, reason)) << reason;
-    EXPECT_EQ(1, factor.Factor(stiffness, reason)) << reason;
-    EXPECT_EQ(1, SolveEigen({stiffness, block, factor, root}, count, pairs, error)) << error.reason;
+    EXPECT_EQ(1, factor.Analyse(stiffness, block, reason)) << reason.Text();
+    EXPECT_EQ(1, factor.Factor(stiffness, reason)) << reason.Text();
+    EXPECT_EQ(1, SolveEigen({stiffness, block, factor, root}, count, pairs, error))
+        << error.reason.Text();
     return pairs;
 }
 

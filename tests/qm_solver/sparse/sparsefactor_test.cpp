@@ -16,18 +16,18 @@ using namespace sample;
 
 Eigen::MatrixXd Solve(CSparseFactor& factor, Eigen::MatrixXd rhs)
 {
-    std::string reason;
+    T_SOLVER_REASON reason;
     const std::span<double> data(rhs.data(), static_cast<std::size_t>(rhs.size()));
-    EXPECT_EQ(1, factor.Solve(data, static_cast<std::size_t>(rhs.cols()), reason)) << reason;
+    EXPECT_EQ(1, factor.Solve(data, static_cast<std::size_t>(rhs.cols()), reason)) << reason.Text();
     return rhs;
 }
 
 void Prepare(CSparseFactor& factor, const Eigen::MatrixXd& k, int blockSize = 6)
 {
-    std::string reason;
+    T_SOLVER_REASON reason;
     const T_SYMMETRIC_MATRIX m = Upper(k);
-    ASSERT_EQ(1, factor.Analyse(m, Blocks(k.rows(), blockSize), reason)) << reason;
-    ASSERT_EQ(1, factor.Factor(m, reason)) << reason;
+    ASSERT_EQ(1, factor.Analyse(m, Blocks(k.rows(), blockSize), reason)) << reason.Text();
+    ASSERT_EQ(1, factor.Factor(m, reason)) << reason.Text();
 }
 
 /// Springs in a chain, node 0 to the ground when `held`.
@@ -96,8 +96,8 @@ TEST(SparseFactor, FactorsOtherValuesAfterOneAnalysis)
     CSparseFactor factor;
     Prepare(factor, a);
     for (double scale : {-2.0, 1.0e-9, 3.0e12}) {
-        std::string reason;
-        ASSERT_EQ(1, factor.Factor(Upper(scale * a), reason)) << reason;
+        T_SOLVER_REASON reason;
+        ASSERT_EQ(1, factor.Factor(Upper(scale * a), reason)) << reason.Text();
         const Eigen::VectorXd b = Eigen::VectorXd::LinSpaced(80, 1.0, 2.0);
         EXPECT_LT((scale * a * Solve(factor, b) - b).norm(), 1e-10);
         EXPECT_EQ(scale < 0.0 ? 80u : 0u, factor.Info().negativePivots);
@@ -117,7 +117,7 @@ TEST(SparseFactor, NamesTheEquationsOfALooseNodeAndOfAFreeChain)
     Prepare(chain, Chain(std::vector<double>(50, 3.0e7), false), 1);
     EXPECT_EQ(1u, chain.Info().nullPivots.size());
     ASSERT_EQ(1, [&] {
-        std::string reason;
+        T_SOLVER_REASON reason;
         return chain.Factor(Upper(Chain(std::vector<double>(50, 3.0e7), true)), reason);
     }());
     EXPECT_TRUE(chain.Info().nullPivots.empty());
@@ -143,7 +143,7 @@ TEST(SparseFactor, GivesNoAlarmOnAStiffnessContrastOfTenBillion)
 TEST(SparseFactor, HasNothingToDoForNoEquations)
 {
     CSparseFactor factor;
-    std::string reason;
+    T_SOLVER_REASON reason;
     EXPECT_EQ(1, factor.Analyse({}, {}, reason));
     EXPECT_EQ(1, factor.Factor({}, reason));
     EXPECT_EQ(1, factor.Solve({}, 0, reason));
@@ -152,7 +152,7 @@ TEST(SparseFactor, HasNothingToDoForNoEquations)
 TEST(SparseFactor, RefusesWhatIsOutOfPlaceWithAReason)
 {
     CSparseFactor factor;
-    std::string reason;
+    T_SOLVER_REASON reason;
     const Eigen::MatrixXd a = RandomMatrix(12, 40.0, 9);
     T_SYMMETRIC_MATRIX m = Upper(a);
     EXPECT_EQ(0, factor.Factor(m, reason)); // not analysed

@@ -116,8 +116,8 @@ TEST(StagedRefusals, NameTheStageAndThePlace)
         EXPECT_EQ(row.element, error.element) << row.label;
         EXPECT_EQ(row.node, error.node) << row.label;
         EXPECT_EQ(row.loadCase, error.loadCase) << row.label;
-        EXPECT_NE(std::string::npos, error.reason.find(row.reason))
-            << row.label << ": " << error.reason;
+        EXPECT_NE(std::string::npos, error.reason.Text().find(row.reason))
+            << row.label << ": " << error.reason.Text();
         T_RESULT r;
         EXPECT_FALSE(staged.ReadSum(0, 1, STAGE_SUM::All, r)) << row.label;
     }

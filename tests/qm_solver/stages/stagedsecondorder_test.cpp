@@ -118,7 +118,7 @@ TEST(StagedSecondOrder, AColumnBeyondItsLoadBuckles)
             if (!above) continue;
             EXPECT_EQ(SOLVER_FAULT::Mechanism, error.fault);
             EXPECT_EQ(0, error.stage);
-            EXPECT_NE(std::string::npos, error.reason.find("buckles"));
+            EXPECT_NE(std::string::npos, error.reason.Text().find("buckles"));
         }
 }
 
