@@ -4,6 +4,7 @@
 #include "inputfile.h"
 #include "output.h"
 #include "qm_base/textformat.h"
+#include "say.h"
 #include "json/analysisjson.h"
 
 #ifdef QM_UI
@@ -27,9 +28,8 @@ struct T_SHOWN {
 /// Shows how far a long run is, where somebody looks at it.
 bool ShowProgress(std::size_t done, std::size_t total)
 {
-    std::fprintf(stderr, "\rqm-rps: analysing, part %zu of %zu%s", done, total,
-                 done == total ? "\n" : "");
-    std::fflush(stderr);
+    ShowOnTerminal(Say("IDS_QM_CLI_ANALYSING", std::to_string(done), std::to_string(total)),
+                   done == total);
     return true;
 }
 
@@ -56,8 +56,8 @@ EXIT_CODE DrawShape(CDBDoc& doc, const T_ANALYSE_OPTIONS& o, const T_SHOWN& show
     T_SHAPE shape = ShapeOfModel(doc);
     if (o.plotMode > 0) {
         if (static_cast<std::size_t>(o.plotMode) > shown.modes.size())
-            return Complain(EXIT_CODE::Usage, "there is no mode " + std::to_string(o.plotMode) +
-                                                  ": ask for it with --modes");
+            return Complain(EXIT_CODE::Usage,
+                            Say("IDS_QM_CLI_NO_MODE", std::to_string(o.plotMode)));
         const T_MODE_RESULTS& m = shown.modes[static_cast<std::size_t>(o.plotMode - 1)];
         shape.mode = true;
         shape.subtitle = "Mode " + std::to_string(o.plotMode);
@@ -69,9 +69,9 @@ EXIT_CODE DrawShape(CDBDoc& doc, const T_ANALYSE_OPTIONS& o, const T_SHOWN& show
         return o.plotCase.empty() || c.name == o.plotCase;
     });
     if (it == shown.cases.end())
-        return Complain(EXIT_CODE::Usage, "\"" + o.plotCase + "\" is not among the cases shown");
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_NOT_SHOWN", o.plotCase));
     const auto index = static_cast<std::size_t>(it - shown.cases.begin());
-    shape.subtitle = "Displacements of " + it->name;
+    shape.subtitle = Say("IDS_QM_CLI_DISPLACEMENTS_OF", it->name);
     shape.states.push_back(StateOf(it->name, shown.results[index].displacements));
     return WritePicture(ShapePlot(shape), o.plot);
 }

@@ -1,5 +1,7 @@
 #include "analysisresults.h"
 
+#include "say.h"
+
 #include <algorithm>
 #include <set>
 
@@ -81,7 +83,7 @@ bool FindShownCases(CDBDoc& doc, const std::vector<std::string>& names,
     if (names.empty()) {
         for (const auto& [key, record] : doc.Data().Model().loadCases)
             out.push_back({record.name, CPostCtrl::MakeLoadComb(key)});
-        if (out.empty()) error = "no load cases";
+        if (out.empty()) error = Say("IDS_QM_CLI_NO_CASES");
         return !out.empty();
     }
     for (const std::string& name : names) {
@@ -92,7 +94,7 @@ bool FindShownCases(CDBDoc& doc, const std::vector<std::string>& names,
         else if (doc.Attr().GetLcom_(name, combination))
             out.push_back({name, combination});
         else
-            error = "no load case or combination named \"" + name + "\"";
+            error = Say("IDS_QM_CLI_NO_CASE", name);
     }
     return error.empty();
 }
@@ -138,11 +140,11 @@ bool FindShownStages(CDBDoc& doc, const std::string& stage, int step, const std:
     if (sum != std::end(kSums))
         key = sum->key;
     else if (!doc.Attr().FindStld(load, key))
-        error = "no load case named \"" + load + "\", nor is it sum, dead or erection";
+        error = Say("IDS_QM_CLI_NO_STAGE_LOAD", load);
     for (const auto& [number, record] : doc.Data().Model().stages) {
         if (!stage.empty() && record.name != stage) continue;
         const T_STAGE_CHOICE choice{number, StageStepNumber(record, step), key};
-        if (choice.step == 0) error = "stage \"" + stage + "\" has no step " + std::to_string(step);
+        if (choice.step == 0) error = Say("IDS_QM_CLI_NO_STAGE_STEP", stage, std::to_string(step));
         out.push_back({record.name,
                        load,
                        record.steps,
@@ -150,8 +152,7 @@ bool FindShownStages(CDBDoc& doc, const std::string& stage, int step, const std:
                        StandingElements(doc.Data().Model(), number).size(),
                        {}});
     }
-    if (error.empty() && out.empty() && !stage.empty())
-        error = "no construction stage named \"" + stage + "\"";
+    if (error.empty() && out.empty() && !stage.empty()) error = Say("IDS_QM_CLI_NO_STAGE", stage);
     return error.empty();
 }
 

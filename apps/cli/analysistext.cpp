@@ -2,6 +2,7 @@
 
 #include "qm_base/textformat.h"
 #include "qm_db/records/structnames.h"
+#include "say.h"
 
 #include <algorithm>
 #include <cmath>
@@ -14,6 +15,11 @@ std::string Column(double value)
     return FormatText(" %13.6g", value);
 }
 
+std::string Short(double value)
+{
+    return FormatText("%.6g", value);
+}
+
 std::string Columns(const T_DOF6& values)
 {
     std::string text;
@@ -22,9 +28,9 @@ std::string Columns(const T_DOF6& values)
     return text;
 }
 
-std::string Head(const char* first, const std::vector<std::string>& names)
+std::string Head(const std::string& first, const std::vector<std::string>& names)
 {
-    std::string text = FormatText("%10s", first);
+    std::string text = FormatText("%10s", first.c_str());
     for (const std::string& name : names)
         text += FormatText(" %13s", name.c_str());
     return text + "\n";
@@ -116,8 +122,8 @@ std::string BeamTable(const T_CASE_RESULTS& r, const T_UNITS& units)
                                     : i == 4 ? "My"
                                              : "Mz") +
                         " (" + (i < 3 ? ForceName(units) : MomentName(units)) + ")");
-    std::string text = "\nbeam forces, local axes (internal, of the cut seen from the I side)\n" +
-                       Head("element at", names);
+    std::string text =
+        "\n" + Say("IDS_QM_CLI_BEAM_FORCES") + "\n" + Head(Say("IDS_QM_CLI_ELEMENT_AT"), names);
     for (const auto& beam : r.beams) {
         for (std::size_t p = 0; p < beam.value.size(); ++p) {
             text += p == 0 ? FormatText("%6d %3s", beam.id, kPositionNames[p])
@@ -156,9 +162,8 @@ std::string MomentName(const T_UNITS& units)
 
 std::string StageTitle(const T_SHOWN_STAGE& stage)
 {
-    return "stage \"" + stage.stage + "\"" +
-           FormatText(", step %d of %d, %s, %zu elements", stage.choice.step, stage.steps,
-                      stage.load.c_str(), stage.elements);
+    return Say("IDS_QM_CLI_STAGE_TITLE", stage.stage, std::to_string(stage.choice.step),
+               std::to_string(stage.steps), stage.load, std::to_string(stage.elements));
 }
 
 std::string CaseTables(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& results,
@@ -166,16 +171,17 @@ std::string CaseTables(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& results,
 {
     const T_CASE_RESULTS r = WithoutRounding(results);
     const std::string force = ForceName(units), length = LengthName(units);
-    std::string text =
-        "\n== " + shown.name + "\n\ndisplacements\n" + Head("node", Dofs("D", length, "R", "rad"));
+    std::string text = "\n== " + shown.name + "\n\n" + Say("IDS_QM_CLI_DISPLACEMENTS") + "\n" +
+                       Head(Say("IDS_QM_CLI_NODE"), Dofs("D", length, "R", "rad"));
     for (const auto& row : r.displacements)
         text += FormatText("%10d", row.id) + Columns(row.value) + "\n";
-    text += "\nreactions (forces of the supports on the structure)\n" +
-            Head("node", Dofs("F", force, "M", MomentName(units)));
+    text += "\n" + Say("IDS_QM_CLI_REACTIONS") + "\n" +
+            Head(Say("IDS_QM_CLI_NODE"), Dofs("F", force, "M", MomentName(units)));
     for (const auto& row : r.reactions)
         text += FormatText("%10d", row.id) + Columns(row.value) + "\n";
     if (!r.trusses.empty())
-        text += "\ntruss forces (tension positive)\n" + Head("element", {"N (" + force + ")"});
+        text += "\n" + Say("IDS_QM_CLI_TRUSS_FORCES") + "\n" +
+                Head(Say("IDS_QM_CLI_ELEMENT"), {"N (" + force + ")"});
     for (const auto& row : r.trusses)
         text += FormatText("%10d", row.id) + Column(row.value) + "\n";
     if (!r.beams.empty()) text += BeamTable(r, units);
@@ -186,9 +192,9 @@ std::string CaseSummary(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& r, cons
 {
     const std::string force = ForceName(units), length = LengthName(units);
     const T_LARGEST d = Largest(r.displacements, Translation);
-    std::string text =
-        shown.name + FormatText(": largest displacement %.6g %s", d.value, length.c_str());
-    if (d.id) text += FormatText(" at node %d", d.id);
+    std::string text = shown.name + ": " +
+                       Say(d.id ? "IDS_QM_CLI_LARGEST_AT_NODE" : "IDS_QM_CLI_LARGEST_DISPLACEMENT",
+                           Short(d.value), length, std::to_string(d.id));
     T_DOF6 sum{};
     for (const auto& row : r.reactions)
         for (std::size_t i = 0; i < sum.size(); ++i)
@@ -199,11 +205,11 @@ std::string CaseSummary(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& r, cons
             {size, std::fabs(row.value[0]), std::fabs(row.value[1]), std::fabs(row.value[2])});
     for (double& s : sum)
         if (std::fabs(s) <= 1e-10 * size) s = 0.0;
-    text += FormatText("; sum of reactions X %.6g, Y %.6g, Z %.6g %s", sum[0], sum[1], sum[2],
-                       force.c_str());
+    text += "; " +
+            Say("IDS_QM_CLI_SUM_OF_REACTIONS", Short(sum[0]), Short(sum[1]), Short(sum[2]), force);
     const T_LARGEST n = Largest(r.trusses, [](double v) { return v; });
     if (n.id)
-        text += FormatText("; largest truss force %.6g %s in %d", n.value, force.c_str(), n.id);
+        text += "; " + Say("IDS_QM_CLI_LARGEST_TRUSS", Short(n.value), force, std::to_string(n.id));
     const auto bending = [](const T_BEAM_ROWS& rows) {
         double largest = 0.0;
         for (const T_DOF6& row : rows)
@@ -212,16 +218,16 @@ std::string CaseSummary(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& r, cons
     };
     const T_LARGEST m = Largest(r.beams, bending);
     if (m.id)
-        text += FormatText("; largest bending moment %.6g %s in %d", m.value,
-                           MomentName(units).c_str(), m.id);
+        text += "; " + Say("IDS_QM_CLI_LARGEST_MOMENT", Short(m.value), MomentName(units),
+                           std::to_string(m.id));
     return text + "\n";
 }
 
 std::string ModeTable(const std::vector<T_MODE_RESULTS>& modes)
 {
-    std::string text =
-        "\nmodes: period, and effective mass in per cent of each direction's total\n" +
-        Head("mode", {"T (s)", "X (%)", "Y (%)", "Z (%)", "RX (%)", "RY (%)", "RZ (%)"});
+    std::string text = "\n" + Say("IDS_QM_CLI_MODES") + "\n" +
+                       Head(Say("IDS_QM_CLI_MODE"),
+                            {"T (s)", "X (%)", "Y (%)", "Z (%)", "RX (%)", "RY (%)", "RZ (%)"});
     T_DOF6 sum{};
     for (std::size_t i = 0; i < modes.size(); ++i) {
         text += FormatText("%10zu", i + 1) + Column(modes[i].period) +
@@ -229,8 +235,9 @@ std::string ModeTable(const std::vector<T_MODE_RESULTS>& modes)
         for (std::size_t k = 0; k < sum.size(); ++k)
             sum[k] += modes[i].massPercent[k];
     }
-    text += FormatText("%10s %13s", "sum", "") + Columns(Cleaned(sum, 100.0)) +
-            "\n\nparticipation factors\n" + Head("mode", {"X", "Y", "Z", "RX", "RY", "RZ"});
+    text += FormatText("%10s %13s", Say("IDS_QM_CLI_SUM").c_str(), "") +
+            Columns(Cleaned(sum, 100.0)) + "\n\n" + Say("IDS_QM_CLI_PARTICIPATION") + "\n" +
+            Head(Say("IDS_QM_CLI_MODE"), {"X", "Y", "Z", "RX", "RY", "RZ"});
     const double largest = LargestOf(modes, &T_MODE_RESULTS::participation);
     for (std::size_t i = 0; i < modes.size(); ++i)
         text +=

@@ -9,6 +9,7 @@
 #include "qm_rps/pushover/pushoverreport.h"
 #include "qm_rps/pushovercurvedlg.h"
 #include "resulttable.h"
+#include "say.h"
 #include "json/resultjson.h"
 
 #ifdef QM_UI
@@ -27,17 +28,18 @@ bool AddExtras(CPushOverCurveDlg& driver, const T_EVALUATE_OPTIONS& options)
 {
     const auto refused = [&](const std::string& what) {
         const auto& messages = driver.Messages();
-        Complain(EXIT_CODE::Usage, what + ": " +
-                                       (messages.empty() ? "not possible with this evaluation"
-                                                         : messages.back().text));
+        Complain(EXIT_CODE::Usage,
+                 what + ": " +
+                     (messages.empty() ? Say("IDS_QM_CLI_NOT_POSSIBLE") : messages.back().text));
         return false;
     };
     for (const int step : options.steps) {
-        if (!driver.OnPushoverCurveAddStep(step)) return refused("step " + std::to_string(step));
+        if (!driver.OnPushoverCurveAddStep(step))
+            return refused(Say("IDS_QM_CLI_STEP_NUMBER", std::to_string(step)));
     }
     for (const std::string& spectrum : options.spectra) {
         if (!driver.CalcAdditionalPerformancePoint(spectrum))
-            return refused("spectrum \"" + spectrum + "\"");
+            return refused(Say("IDS_QM_CLI_SPECTRUM_QUOTED", spectrum));
     }
     return true;
 }
@@ -53,15 +55,17 @@ EXIT_CODE EvaluateAll(CDBDoc& doc, const T_EVALUATE_OPTIONS& options,
         T_EVAL_D eval;
         if (!doc.Attr().GetEval(entry.first, eval)) continue;
         if (!driver.SetEvaluation(eval))
-            return Complain(EXIT_CODE::BadInput, doc.Path() + ": evaluation \"" + eval.name +
-                                                     "\": " + driver.SettingsError());
+            return Complain(EXIT_CODE::BadInput,
+                            doc.Path() + ": " + Say("IDS_QM_CLI_EVALUATION_QUOTED", eval.name) +
+                                ": " + driver.SettingsError());
         driver.Evaluate();
         if (!AddExtras(driver, options)) return EXIT_CODE::Usage;
         out.push_back(driver.Result());
     }
     if (!out.empty()) return EXIT_CODE::Done;
-    if (only.empty()) return Complain(EXIT_CODE::BadInput, doc.Path() + ": no evaluations");
-    return Complain(EXIT_CODE::Usage, doc.Path() + ": no evaluation named \"" + only + "\"");
+    if (only.empty())
+        return Complain(EXIT_CODE::BadInput, doc.Path() + ": " + Say("IDS_QM_CLI_NO_EVALUATIONS"));
+    return Complain(EXIT_CODE::Usage, doc.Path() + ": " + Say("IDS_QM_CLI_NO_EVALUATION", only));
 }
 
 /// The path itself for one evaluation; for several a number before the extension.
@@ -104,8 +108,7 @@ void StoreSteps(CDBDoc& doc)
 {
     T_FILE_ERROR error;
     if (!doc.SaveModel(error))
-        std::fprintf(stderr, "qm-rps: the limit-state steps were not stored: %s\n",
-                     error.text.c_str());
+        Complain(EXIT_CODE::Done, Say("IDS_QM_CLI_STEPS_NOT_STORED", error.text));
 }
 
 EXIT_CODE WriteResults(const T_EVALUATE_OPTIONS& o, const std::vector<T_PUSH_EVALUATION>& results)
@@ -150,7 +153,7 @@ EXIT_CODE RunInfo(const std::string& file, bool check)
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, file); code != EXIT_CODE::Done) return code;
     std::printf("%s", InfoText(doc).c_str());
-    if (check) std::printf("  every table and every result block was read and is whole\n");
+    if (check) std::printf("  %s\n", Say("IDS_QM_CLI_INFO_WHOLE").c_str());
     return EXIT_CODE::Done;
 }
 

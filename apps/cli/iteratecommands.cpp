@@ -6,6 +6,7 @@
 #include "qm_rps/factors/ulfstageresults.h"
 #include "qm_rps/ulfiterationdochost.h"
 #include "qm_rps/unknownloadfactoriteranal.h"
+#include "say.h"
 #include "ulfrun.h"
 #include "json/jsonwriter.h"
 
@@ -44,8 +45,9 @@ public:
     bool GoesOn(int done, int required) override
     {
         if (done != m_shown && isatty(STDERR_FILENO)) {
-            std::fprintf(stderr, "\rqm-rps: %d of at most %d iterations done", done, required);
-            std::fflush(stderr);
+            ShowOnTerminal(
+                Say("IDS_QM_CLI_ITERATIONS_DONE", std::to_string(done), std::to_string(required)),
+                false);
         }
         m_shown = done;
         return !g_cancel;
@@ -58,28 +60,33 @@ private:
 
 struct T_END_WORDS {
     ULF_ITER_END end;
-    const char* status;
+    const char* status; // in files
+    const char* key;    // of the same in words
     EXIT_CODE code;
 };
 constexpr T_END_WORDS kEnds[] = {
-    {ULF_ITER_END::Converged, "converged", EXIT_CODE::Done},
-    {ULF_ITER_END::Required, "not converged", EXIT_CODE::NotFound},
-    {ULF_ITER_END::Declined, "declined", EXIT_CODE::NotFound},
-    {ULF_ITER_END::Cancelled, "cancelled", EXIT_CODE::NotFound},
-    {ULF_ITER_END::NotSolved, "no factors found", EXIT_CODE::NotFound},
-    {ULF_ITER_END::ReportNotWritten, "report not written", EXIT_CODE::NoAccess},
-    {ULF_ITER_END::NotSaved, "model copy not saved", EXIT_CODE::NoAccess},
-    {ULF_ITER_END::NotScaled, "pretension not changed", EXIT_CODE::BadInput},
-    {ULF_ITER_END::NotAnalysed, "not analysed", EXIT_CODE::BadInput},
+    {ULF_ITER_END::Converged, "converged", "IDS_QM_CLI_CONVERGED", EXIT_CODE::Done},
+    {ULF_ITER_END::Required, "not converged", "IDS_QM_CLI_NOT_CONVERGED", EXIT_CODE::NotFound},
+    {ULF_ITER_END::Declined, "declined", "IDS_QM_CLI_DECLINED", EXIT_CODE::NotFound},
+    {ULF_ITER_END::Cancelled, "cancelled", "IDS_QM_CLI_CANCELLED", EXIT_CODE::NotFound},
+    {ULF_ITER_END::NotSolved, "no factors found", "IDS_QM_CLI_NO_FACTORS", EXIT_CODE::NotFound},
+    {ULF_ITER_END::ReportNotWritten, "report not written", "IDS_QM_CLI_NO_REPORT",
+     EXIT_CODE::NoAccess},
+    {ULF_ITER_END::NotSaved, "model copy not saved", "IDS_QM_CLI_NO_COPY", EXIT_CODE::NoAccess},
+    {ULF_ITER_END::NotScaled, "pretension not changed", "IDS_QM_CLI_NOT_SCALED",
+     EXIT_CODE::BadInput},
+    {ULF_ITER_END::NotAnalysed, "not analysed", "IDS_QM_CLI_NOT_ANALYSED", EXIT_CODE::BadInput},
 };
 
 T_END_WORDS WordsOf(const CUlfIteration& run, const T_ITERATE_OPTIONS& o, bool met)
 {
     const bool done = run.End() == ULF_ITER_END::Required ? o.iterations == 0
                                                           : run.End() == ULF_ITER_END::Converged;
-    if (done && !met) return {run.End(), "constraints not met", EXIT_CODE::NotFound};
+    if (done && !met)
+        return {run.End(), "constraints not met", "IDS_QM_CLI_CONSTRAINTS_NOT_MET",
+                EXIT_CODE::NotFound};
     if (run.End() == ULF_ITER_END::Required && o.iterations == 0)
-        return {run.End(), "solved", EXIT_CODE::Done};
+        return {run.End(), "solved", "IDS_QM_CLI_SOLVED", EXIT_CODE::Done};
     for (const T_END_WORDS& words : kEnds)
         if (words.end == run.End()) return words;
     return kEnds[0];
@@ -117,32 +124,34 @@ std::string HistoryJson(const CUlfIteration& run, const char* status)
 
 void PrintHistory(const CUlfIteration& run)
 {
-    std::printf("%9s %14s  %s\n", "iteration", "tolerance", "model");
+    std::printf("%9s %14s  %s\n", Say("IDS_QM_CLI_ITERATION").c_str(),
+                Say("IDS_QM_CLI_TOLERANCE").c_str(), Say("IDS_QM_CLI_MODEL").c_str());
     for (const T_ULF_ITER_STEP& step : run.History())
         std::printf("%9d %14.6g  %s\n", step.iteration, step.tolerance, step.file.c_str());
     if (run.History().empty()) return;
     const std::vector<double> applied = UlfIterApplied(run.History());
-    std::printf("\n%-30s %-16s %16s %16s  %s\n", "stage/step", "load case", "factor", "applied",
-                "pretension");
+    std::printf("\n%-30s %-16s %16s %16s  %s\n", Say("IDS_QM_CLI_STAGE_STEP").c_str(),
+                Say("IDS_QM_CLI_LOAD_CASE").c_str(), Say("IDS_QM_CLI_FACTOR").c_str(),
+                Say("IDS_QM_CLI_APPLIED").c_str(), Say("IDS_QM_CLI_PRETENSION").c_str());
     const std::vector<T_ULF_ITER_ROW>& rows = run.History().back().rows;
     for (std::size_t i = 0; i < rows.size(); ++i)
         std::printf("%-30s %-16s %16.9g %16.9g  %s\n", rows[i].place.c_str(), rows[i].load.c_str(),
-                    rows[i].factor + 0.0, applied[i], rows[i].pretension ? "yes" : "no");
+                    rows[i].factor + 0.0, applied[i],
+                    Say(rows[i].pretension ? "IDS_QM_CLI_YES" : "IDS_QM_CLI_NO").c_str());
 }
 
 EXIT_CODE CheckOptions(const T_ITERATE_OPTIONS& o)
 {
     CUnknownLoadFactorIterAnal trial;
     if (!trial.Set({o.iterations, o.tolerance}))
-        return Complain(EXIT_CODE::Usage, "iterations must be 0 to 99, the tolerance 0 or more");
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_ITERATE_LIMITS"));
     if (o.overwrite && o.append)
-        return Complain(EXIT_CODE::Usage, "choose --overwrite or --append, not both");
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_ITERATE_EITHER"));
     if (const EXIT_CODE code = CheckPlotName(o.plot); code != EXIT_CODE::Done) return code;
     const std::string report = UlfIterReportPath(o.file);
     std::error_code ignored;
     if (!o.overwrite && !o.append && std::filesystem::exists(report, ignored))
-        return Complain(EXIT_CODE::NoAccess,
-                        report + ": the report is there already; say --overwrite or --append");
+        return Complain(EXIT_CODE::NoAccess, report + ": " + Say("IDS_QM_CLI_REPORT_THERE"));
     return EXIT_CODE::Done;
 }
 
@@ -170,8 +179,7 @@ EXIT_CODE RunUlfIterate(const T_ITERATE_OPTIONS& o)
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     int key = 0;
     if (!doc.Attr().FindUlsi(o.item, key))
-        return Complain(EXIT_CODE::Usage,
-                        o.file + ": no construction-stage item named \"" + o.item + "\"");
+        return Complain(EXIT_CODE::Usage, o.file + ": " + Say("IDS_QM_CLI_NO_STAGE_ITEM", o.item));
     const T_ULSI_D item = doc.Data().Model().ulfStageItems.at(key);
     if (const auto findings = CheckUlfStageItem(item, key, doc.Data()); !findings.empty())
         return Complain(EXIT_CODE::BadInput, o.file + ": " + findings.front().text);
@@ -181,7 +189,7 @@ EXIT_CODE RunUlfIterate(const T_ITERATE_OPTIONS& o)
     CIteratePerson person(o.overwrite);
     CUnknownLoadFactorIterAnal* settings = CUnknownLoadFactorIterAnal::Of(doc.DynModules());
     if (!settings || !settings->Set({o.iterations, o.tolerance}))
-        return Complain(EXIT_CODE::Usage, "the settings of the iteration were refused");
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_ITERATE_REFUSED"));
     CUlfIteration run(host, person, settings->Settings());
     const T_INTERRUPT interrupt;
     const int done = run.Run();
@@ -192,7 +200,8 @@ EXIT_CODE RunUlfIterate(const T_ITERATE_OPTIONS& o)
     const std::string said = run.Said() ? run.Said()->text : std::string();
     const std::string reason = host.Error().empty() ? said : host.Error();
     if (!done || words.code != EXIT_CODE::Done)
-        Complain(words.code, o.file + ": " + words.status + (reason.empty() ? "" : ": " + reason));
+        Complain(words.code,
+                 o.file + ": " + Say(words.key) + (reason.empty() ? "" : ": " + reason));
     const EXIT_CODE written = WriteResults(run, o, words.status);
     return words.code == EXIT_CODE::Done ? written : words.code;
 }

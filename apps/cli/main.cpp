@@ -1,8 +1,10 @@
 // qm-rps: the command line. Reads the arguments; the commands do the work.
 #include "commands.h"
+#include "output.h"
 #include "qm_base/msgfunction.h"
 #include "qm_rps/pushover/pushoverreport.h"
 #include "registrations.h"
+#include "say.h"
 #include "verify.h"
 
 #include <CLI/CLI.hpp>
@@ -134,13 +136,11 @@ int main(int argc, char** argv)
             app.get_subcommands([&](const CLI::App* s) { return s->get_name() == argv[1]; })
                 .empty();
         const std::string what =
-            unknown ? "unknown command \"" + std::string(argv[1]) + "\"" : e.what();
-        std::fprintf(stderr, "qm-rps: %s (see qm-rps --help)\n", what.c_str());
-        return ToInt(EXIT_CODE::Usage);
+            unknown ? Say("IDS_QM_CLI_UNKNOWN_COMMAND", std::string(argv[1])) : e.what();
+        return ToInt(Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_SEE_HELP", what)));
     }
     if (std::fflush(stdout) != 0 || std::ferror(stdout) != 0) {
-        std::fprintf(stderr, "qm-rps: standard output can't be written\n");
-        return ToInt(EXIT_CODE::NoAccess);
+        return ToInt(Complain(EXIT_CODE::NoAccess, Say("IDS_QM_CLI_NO_STDOUT")));
     }
     return ToInt(code);
 }

@@ -2,6 +2,7 @@
 
 #include "inputfile.h"
 #include "qm_db/filectrl.h"
+#include "say.h"
 
 #ifdef QM_UI
 #include "qm_ui/plot/plotfile.h"
@@ -15,6 +16,12 @@ EXIT_CODE Complain(EXIT_CODE code, const std::string& text)
     return code;
 }
 
+void ShowOnTerminal(const std::string& text, bool last)
+{
+    std::fprintf(stderr, "\rqm-rps: %s%s", text.c_str(), last ? "\n" : "");
+    std::fflush(stderr);
+}
+
 EXIT_CODE CheckPlotName(const std::string& path)
 {
     if (path.empty()) return EXIT_CODE::Done;
@@ -22,9 +29,9 @@ EXIT_CODE CheckPlotName(const std::string& path)
     for (const char* extension : {".svg", ".pdf", ".png", ".jpg", ".jpeg", ".bmp"}) {
         if (path.ends_with(extension)) return EXIT_CODE::Done;
     }
-    return Complain(EXIT_CODE::Usage, path + ": a picture is .svg, .pdf, .png, .jpg or .bmp");
+    return Complain(EXIT_CODE::Usage, path + ": " + Say("IDS_QM_CLI_PICTURE_NAME"));
 #else
-    return Complain(EXIT_CODE::Usage, path + ": this qm-rps was built without pictures");
+    return Complain(EXIT_CODE::Usage, path + ": " + Say("IDS_QM_CLI_NO_PICTURES"));
 #endif
 }
 
@@ -34,7 +41,7 @@ EXIT_CODE WriteOutput(const std::string& path, std::string_view text)
         const bool whole = std::fwrite(text.data(), 1, text.size(), stdout) == text.size();
         return whole && std::fflush(stdout) == 0
                    ? EXIT_CODE::Done
-                   : Complain(EXIT_CODE::NoAccess, "standard output can't be written");
+                   : Complain(EXIT_CODE::NoAccess, Say("IDS_QM_CLI_NO_STDOUT"));
     }
     T_FILE_ERROR error;
     return CFileCtrl::WriteWholeFile(path, text, error) ? EXIT_CODE::Done : ReportFileError(error);

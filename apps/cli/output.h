@@ -12,6 +12,9 @@ struct T_PLOT;
 /// One line on stderr; gives the code back.
 EXIT_CODE Complain(EXIT_CODE code, const std::string& text);
 
+/// A line on the terminal that the next call writes over; the last one ends it.
+void ShowOnTerminal(const std::string& text, bool last);
+
 /// Done for no name or one that ends in a picture format that this program can draw; else a
 /// message and Usage.
 EXIT_CODE CheckPlotName(const std::string& path);

@@ -2,12 +2,19 @@
 
 #include "qm_base/textformat.h"
 #include "qm_rps/pushover/fema440coefficients.h"
+#include "say.h"
 
 namespace {
 
 std::string Number(const std::optional<double>& v)
 {
     return v ? FormatText("%.5g", *v) : "-";
+}
+/// A text of the catalogue on a line of its own, behind so many blanks.
+template <class... ARGS>
+std::string Line(std::size_t blanks, std::string_view key, const ARGS&... args)
+{
+    return std::string(blanks, ' ') + Say(key, args...) + "\n";
 }
 std::string Step(const std::optional<int>& v)
 {
@@ -31,12 +38,13 @@ std::string Method(const T_PUSH_EVALUATION& e)
 
 std::string PointLine(const T_PUSH_EVALUATION& e, int width)
 {
-    static constexpr const char* kStatus[] = {"not found", "found", "elastic"};
+    static constexpr const char* kStatus[] = {"IDS_QM_CLI_NOT_FOUND", "IDS_QM_CLI_FOUND",
+                                              "IDS_QM_CLI_ELASTIC"};
     const auto value = [&](auto member) {
         return e.point ? Number((*e.point).*member) : std::string("-");
     };
     return FormatText("%-*s %-11s %-10s %11s %11s %11s %10s %9s %9s %6zu\n", width,
-                      e.eval.name.c_str(), Method(e).c_str(), kStatus[e.result],
+                      e.eval.name.c_str(), Method(e).c_str(), Say(kStatus[e.result]).c_str(),
                       value(&T_PERF_POINT::D).c_str(), value(&T_PERF_POINT::V).c_str(),
                       value(&T_PERF_POINT::Sd).c_str(), value(&T_PERF_POINT::Sa).c_str(),
                       value(&T_PERF_POINT::Teff).c_str(),
@@ -45,10 +53,13 @@ std::string PointLine(const T_PUSH_EVALUATION& e, int width)
 
 std::string StateLines(const T_PUSH_EVALUATION& e)
 {
-    std::string text = FormatText("\n%s: limit states (%s at the control node)\n",
-                                  e.eval.name.c_str(), std::string(NameOf(e.units.length)).c_str());
-    text += FormatText("  %-6s %12s %6s %12s %6s  %s\n", "state", "demand", "step", "capacity",
-                       "step", "remark");
+    std::string text =
+        "\n" + Say("IDS_QM_CLI_LIMIT_STATES", e.eval.name, NameOf(e.units.length)) + "\n";
+    const std::string step = Say("IDS_QM_CLI_STEP");
+    text += FormatText("  %-6s %12s %6s %12s %6s  %s\n", Say("IDS_QM_CLI_STATE").c_str(),
+                       Say("IDS_QM_CLI_DEMAND").c_str(), step.c_str(),
+                       Say("IDS_QM_CLI_CAPACITY").c_str(), step.c_str(),
+                       Say("IDS_QM_CLI_REMARK").c_str());
     for (const T_LIMIT_ROW& r : e.limitStates)
         text +=
             FormatText("  %-6s %12s %6s %12s %6s  %s\n", r.name.c_str(), Number(r.demand).c_str(),
@@ -61,19 +72,20 @@ std::string AdditionalLines(const T_PUSH_EVALUATION& e, int width)
 {
     std::string text;
     if (e.allPoints.size() > 1) {
-        text += FormatText("%-*s   demand equals capacity at D =", width, "");
+        text += FormatText("%-*s   %s", width, "", Say("IDS_QM_CLI_ALL_POINTS").c_str());
         for (const T_PERF_POINT& p : e.allPoints)
             text += FormatText(" %.5g", p.D);
         text += "\n";
     }
     for (const T_ADDITIONAL_STEP& s : e.additionalSteps)
-        text += FormatText("%-*s   step %d: D = %.5g, V = %.5g, Sd = %.5g, Sa = %.5g\n", width, "",
-                           s.step, s.D, s.V, s.Sd, s.Sa);
+        text += FormatText("%-*s   %s: D = %.5g, V = %.5g, Sd = %.5g, Sa = %.5g\n", width, "",
+                           Say("IDS_QM_CLI_STEP_NUMBER", std::to_string(s.step)).c_str(), s.D, s.V,
+                           s.Sd, s.Sa);
     for (const T_ADDITIONAL_POINT& p : e.additionalPoints)
-        text +=
-            FormatText("%-*s   spectrum %s: %s, D = %s, V = %s\n", width, "", p.spectrum.c_str(),
-                       OutcomeName(p.outcome).c_str(), p.point ? Number(p.point->D).c_str() : "-",
-                       p.point ? Number(p.point->V).c_str() : "-");
+        text += FormatText(
+            "%-*s   %s: %s, D = %s, V = %s\n", width, "",
+            Say("IDS_QM_CLI_SPECTRUM", p.spectrum).c_str(), OutcomeName(p.outcome).c_str(),
+            p.point ? Number(p.point->D).c_str() : "-", p.point ? Number(p.point->V).c_str() : "-");
     return text;
 }
 
@@ -81,9 +93,10 @@ std::string TrialLines(const T_PUSH_EVALUATION& e)
 {
     const char* const format =
         "  %5s %10s %10s %10s %10s %9s %9s %8s %9s %8s %8s %9s %9s %10s %10s";
-    std::string text = FormatText(format, "trial", "dpi", "api", "dy", "ay", "alpha", "mu", "kappa",
-                                  "beta_eff", "SRa", "SRv", "T_eff", "M", "Di", "Ai") +
-                       "\n";
+    std::string text =
+        FormatText(format, Say("IDS_QM_CLI_TRIAL").c_str(), "dpi", "api", "dy", "ay", "alpha", "mu",
+                   "kappa", "beta_eff", "SRa", "SRv", "T_eff", "M", "Di", "Ai") +
+        "\n";
     for (const T_PERFPT_TRIAL& t : e.trace) {
         text += FormatText(format, std::to_string(t.trial).c_str(), Number(t.dpi).c_str(),
                            Number(t.api).c_str(), Number(t.dy).c_str(), Number(t.ay).c_str(),
@@ -104,9 +117,11 @@ std::string ResultTable(const std::vector<T_PUSH_EVALUATION>& results)
     const int width = static_cast<int>(NameWidth(results));
     const std::string F(NameOf(results[0].units.force)), L(NameOf(results[0].units.length));
     std::string text =
-        FormatText("%-*s %-11s %-10s %11s %11s %11s %10s %9s %9s %6s\n", width, "evaluation",
-                   "method", "status", ("D [" + L + "]").c_str(), ("V [" + F + "]").c_str(),
-                   ("Sd [" + L + "]").c_str(), "Sa [g]", "T_eff [s]", "beta [%]", "trials");
+        FormatText("%-*s %-11s %-10s %11s %11s %11s %10s %9s %9s %6s\n", width,
+                   Say("IDS_QM_CLI_EVALUATION").c_str(), Say("IDS_QM_CLI_METHOD").c_str(),
+                   Say("IDS_QM_CLI_STATUS").c_str(), ("D [" + L + "]").c_str(),
+                   ("V [" + F + "]").c_str(), ("Sd [" + L + "]").c_str(), "Sa [g]", "T_eff [s]",
+                   "beta [%]", Say("IDS_QM_CLI_TRIALS").c_str());
     for (const auto& e : results)
         text += PointLine(e, width);
     for (const auto& e : results) {
@@ -129,9 +144,10 @@ std::string ComparisonTable(const T_PUSH_COMPARISON& c)
 {
     if (c.results.empty()) return {};
     const std::string F(NameOf(c.results[0].units.force)), L(NameOf(c.results[0].units.length));
-    std::string text = FormatText("%-12s %12s %12s %12s %10s %9s  %s\n", "method",
-                                  ("D [" + L + "]").c_str(), ("V [" + F + "]").c_str(),
-                                  ("Sd [" + L + "]").c_str(), "Sa [g]", "D / mean", "outcome");
+    std::string text =
+        FormatText("%-12s %12s %12s %12s %10s %9s  %s\n", Say("IDS_QM_CLI_METHOD").c_str(),
+                   ("D [" + L + "]").c_str(), ("V [" + F + "]").c_str(), ("Sd [" + L + "]").c_str(),
+                   "Sa [g]", Say("IDS_QM_CLI_BY_MEAN").c_str(), Say("IDS_QM_CLI_OUTCOME").c_str());
     for (const T_COMPARISON_ROW& row : c.rows) {
         const auto value = [&](double v) { return row.found ? FormatText("%.5g", v) : "-"; };
         text += FormatText("%-12s %12s %12s %12s %10s %9s  %s\n", row.label.c_str(),
@@ -141,25 +157,27 @@ std::string ComparisonTable(const T_PUSH_COMPARISON& c)
                            OutcomeName(row.outcome).c_str());
     }
     if (c.count > 0)
-        text += FormatText("\nspread of D over %d methods: %.5g to %.5g %s, mean %.5g, "
-                           "largest / smallest %.3f\n",
-                           c.count, c.minD, c.maxD, L.c_str(), c.meanD, c.maxD / c.minD);
+        text += "\n" +
+                Say("IDS_QM_CLI_SPREAD", std::to_string(c.count), Number(c.minD), Number(c.maxD), L,
+                    Number(c.meanD), FormatText("%.3f", c.maxD / c.minD)) +
+                "\n";
     return text;
 }
 
 std::string TraceTable(const T_PUSH_EVALUATION& e)
 {
     std::string text =
-        FormatText("\n%s: %s\n", e.eval.name.c_str(), e.IsTarget() ? "derivation" : "trials");
+        FormatText("\n%s: %s\n", e.eval.name.c_str(),
+                   Say(e.IsTarget() ? "IDS_QM_CLI_DERIVATION" : "IDS_QM_CLI_TRIALS").c_str());
     if (!e.IsTarget()) text += TrialLines(e);
     for (std::size_t i = 0; i < e.targets.size(); ++i) {
         const T_TARGET_DISP& t = e.targets[i];
-        text +=
-            FormatText("  %s T*=%s Tc=%s Se=%s ay=%s dy=%s qu=%s det*=%s dt*=%s%s\n",
-                       e.targets.size() > 1 ? kLimitStateNames[i] : "SD", Number(t.Tstar).c_str(),
-                       Number(t.Tc).c_str(), Number(t.Se).c_str(), Number(t.ay).c_str(),
-                       Number(t.dy).c_str(), Number(t.qu).c_str(), Number(t.det).c_str(),
-                       Number(t.dt).c_str(), t.capped ? " (limited to 3 det*)" : "");
+        text += FormatText("  %s T*=%s Tc=%s Se=%s ay=%s dy=%s qu=%s det*=%s dt*=%s%s\n",
+                           e.targets.size() > 1 ? kLimitStateNames[i] : "SD",
+                           Number(t.Tstar).c_str(), Number(t.Tc).c_str(), Number(t.Se).c_str(),
+                           Number(t.ay).c_str(), Number(t.dy).c_str(), Number(t.qu).c_str(),
+                           Number(t.det).c_str(), Number(t.dt).c_str(),
+                           t.capped ? (" " + Say("IDS_QM_CLI_CAPPED")).c_str() : "");
     }
     return text;
 }
@@ -168,30 +186,31 @@ std::string InfoText(CDBDoc& doc)
 {
     const T_MODEL& m = doc.Data().Model();
     std::string text =
-        FormatText("%s\n  title: %s\n  units: %s, %s\n", doc.Path().c_str(), m.styp.title.c_str(),
-                   std::string(NameOf(m.styp.units.force)).c_str(),
-                   std::string(NameOf(m.styp.units.length)).c_str());
-    text += FormatText("  nodes: %zu, storeys: %zu, modes: %zu, spectra: %zu, evaluations: %zu\n",
-                       m.nodes.size(), m.storeys.size(), m.modes.size(), m.spectra.size(),
-                       m.evaluations.size());
+        doc.Path() + "\n" + Line(2, "IDS_QM_CLI_INFO_TITLE", m.styp.title) +
+        Line(2, "IDS_QM_CLI_INFO_UNITS", NameOf(m.styp.units.force), NameOf(m.styp.units.length)) +
+        Line(2, "IDS_QM_CLI_INFO_COUNTS", std::to_string(m.nodes.size()),
+             std::to_string(m.storeys.size()), std::to_string(m.modes.size()),
+             std::to_string(m.spectra.size()), std::to_string(m.evaluations.size()));
     for (const auto& [key, polc] : m.pushovers) {
         const auto result = doc.Data().Content().results.find(key);
         const int steps =
             result != doc.Data().Content().results.end() ? result->second->StepCount() : 0;
-        text += FormatText("  pushover %s: %d steps, node %d %s, %s\n", polc.name.c_str(), steps,
-                           polc.controlNode,
-                           kDirectionNames[static_cast<std::size_t>(polc.direction - 1)],
-                           kPatternNames[static_cast<std::size_t>(polc.patternKind)]);
+        text += Line(2, "IDS_QM_CLI_INFO_PUSH", polc.name, std::to_string(steps),
+                     std::to_string(polc.controlNode),
+                     kDirectionNames[static_cast<std::size_t>(polc.direction - 1)],
+                     kPatternNames[static_cast<std::size_t>(polc.patternKind)]);
         std::array<int, 3> s{};
         if (doc.Post().GetPoverInfo()->GetStepEC8(key, s))
-            text += FormatText("    EC8 steps: DL %d, SD %d, NC %d\n", s[0], s[1], s[2]);
+            text += Line(4, "IDS_QM_CLI_INFO_EC8", std::to_string(s[0]), std::to_string(s[1]),
+                         std::to_string(s[2]));
         if (doc.Post().GetPoverInfo()->GetStepNTC2008(key, s))
-            text += FormatText("    NTC steps: SLD %d, SLV %d, SLC %d\n", s[0], s[1], s[2]);
+            text += Line(4, "IDS_QM_CLI_INFO_NTC", std::to_string(s[0]), std::to_string(s[1]),
+                         std::to_string(s[2]));
     }
     for (const auto& [key, spectrum] : m.spectra)
-        text += FormatText("  spectrum %s\n", spectrum.name.c_str());
+        text += Line(2, "IDS_QM_CLI_SPECTRUM", spectrum.name);
     for (const auto& [key, eval] : m.evaluations)
-        text += FormatText("  evaluation %s: %s on %s with %s\n", eval.name.c_str(),
-                           MethodName(eval.method), eval.push.c_str(), eval.spectrum.c_str());
+        text += Line(2, "IDS_QM_CLI_INFO_EVALUATION", eval.name, MethodName(eval.method), eval.push,
+                     eval.spectrum);
     return text;
 }

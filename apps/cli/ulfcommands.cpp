@@ -3,13 +3,12 @@
 #include "inputfile.h"
 #include "output.h"
 #include "qm_base/messagehistory.h"
-#include "qm_base/msgfunction.h"
-#include "qm_base/textformat.h"
 #include "qm_rps/factors/ulfstageplace.h"
 #include "qm_rps/factors/ulftexts.h"
 #include "qm_rps/unknownloadfactoritemdlg.h"
 #include "qm_rps/unknownloadfactorresultdlg.h"
 #include "qm_rps/unknownstageitemdlg.h"
+#include "say.h"
 #include "ulfrun.h"
 #include "json/ulfjson.h"
 
@@ -23,8 +22,6 @@
 #include <ctime>
 #include <filesystem>
 #include <unistd.h>
-
-using zql::lib::MMSGFunction;
 
 namespace {
 
@@ -51,14 +48,15 @@ EXIT_CODE SolveOpened(const T_ULF_OPTIONS& o, T_ULF_OPENED& in)
 /// Displacements of the known cases alone, and of all with the factors found.
 EXIT_CODE DrawBeforeAfter(CDBDoc& doc, const T_ULF_RESULT& r, const std::string& path)
 {
-    T_SHOWN_CASE before{"known load cases alone", {}}, after{"with the factors found", {}};
+    T_SHOWN_CASE before{Say("IDS_QM_CLI_KNOWN_ALONE"), {}},
+        after{Say("IDS_QM_CLI_WITH_FACTORS"), {}};
     for (std::size_t i = 0; i < r.cases.size(); ++i) {
         if (!r.cases[i].unknown)
             before.combination.items.push_back({false, r.cases[i].key, r.factors[i]});
         after.combination.items.push_back({false, r.cases[i].key, r.factors[i]});
     }
     T_SHAPE shape = ShapeOfModel(doc);
-    shape.subtitle = "Unknown load factors: " + r.item.name;
+    shape.subtitle = Say("IDS_QM_PLOT_ULF_TITLE", r.item.name);
     for (const T_SHOWN_CASE& state : {before, after}) {
         T_CASE_RESULTS results;
         std::string error;
@@ -86,9 +84,8 @@ EXIT_CODE DrawPictures(CDBDoc& doc, const T_ULF_RESULT& r, const T_ULF_OPTIONS& 
 /// Shows how far a long search is, where somebody looks at it.
 bool ShowSearch(int tried, int members)
 {
-    std::fprintf(stderr, "\rqm-rps: looking for the contradiction, %d of %d%s", tried, members,
-                 tried == members ? "\n" : "");
-    std::fflush(stderr);
+    ShowOnTerminal(Say("IDS_QM_CLI_CONTRADICTION", std::to_string(tried), std::to_string(members)),
+                   tried == members);
     return true;
 }
 
@@ -110,30 +107,38 @@ bool SetDate(const std::string& text, T_ULF_SHEET_SETTINGS& settings)
            settings.month >= 1 && settings.month <= 12 && settings.day >= 1 && settings.day <= 31;
 }
 
+void PrintItem(const std::string& text, bool equations)
+{
+    std::printf("%s%s\n", text.c_str(), equations ? Say("IDS_QM_CLI_AS_EQUATIONS").c_str() : "");
+}
+
 void ListItem(CDBDoc& doc, int key, const T_ULFI_D& item)
 {
     const auto& combinations = doc.Data().Model().combinations;
     const auto it = combinations.find(item.combination);
-    std::printf("%s: combination %s, %zu of %zu load cases unknown, %zu constraints%s\n",
-                item.name.c_str(), it == combinations.end() ? "-" : it->second.name.c_str(),
-                item.unknowns.size(), CUnknownLoadFactorItemDlg(doc, key).Cases().size(),
-                item.constraints.size(), item.solveByEquations ? ", solved as equations" : "");
+    const std::size_t cases = CUnknownLoadFactorItemDlg(doc, key).Cases().size();
+    PrintItem(Say("IDS_QM_CLI_ULF_ITEM", item.name,
+                  it == combinations.end() ? "-" : it->second.name,
+                  std::to_string(item.unknowns.size()), std::to_string(cases),
+                  std::to_string(item.constraints.size())),
+              item.solveByEquations);
 }
 
 void ListStageItem(const T_ULSI_D& item)
 {
     const auto unknown = std::ranges::count_if(item.rows, &T_ULSI_ROW::unknown);
     const auto scaling = std::ranges::count_if(item.rows, &T_ULSI_ROW::pretension);
-    std::printf("%s: construction stages, %td of %zu loads unknown (%td scale pretension), "
-                "%zu constraints%s\n",
-                item.name.c_str(), unknown, item.rows.size(), scaling, item.constraints.size(),
-                item.solveByEquations ? ", solved as equations" : "");
+    PrintItem(Say("IDS_QM_CLI_ULF_STAGE_ITEM", item.name, std::to_string(unknown),
+                  std::to_string(item.rows.size()), std::to_string(scaling),
+                  std::to_string(item.constraints.size())),
+              item.solveByEquations);
 }
 
 EXIT_CODE LastMessage(const zql::frx::MDialog& dialog, EXIT_CODE code, const std::string& file)
 {
     const auto& messages = dialog.Messages();
-    return Complain(code, messages.empty() ? file + ": refused" : messages.back().text);
+    return Complain(code, messages.empty() ? file + ": " + Say("IDS_QM_CLI_REFUSED")
+                                           : messages.back().text);
 }
 
 } // namespace
@@ -153,8 +158,10 @@ EXIT_CODE RunUlfList(const T_ULF_OPTIONS& o)
         const std::string place = UlfPlaceText(doc.Data(), c.stage, c.step);
         std::printf("  %s: %s\n", UlfNameAt(c.name, place).c_str(), UlfDescription(c).c_str());
     }
-    std::printf("%zu items, %zu constraints\n", model.ulfItems.size() + model.ulfStageItems.size(),
-                model.ulfConstraints.size());
+    const std::size_t items = model.ulfItems.size() + model.ulfStageItems.size();
+    std::printf("%s\n", Say("IDS_QM_CLI_ULF_COUNTS", std::to_string(items),
+                            std::to_string(model.ulfConstraints.size()))
+                            .c_str());
     return EXIT_CODE::Done;
 }
 
@@ -176,9 +183,10 @@ EXIT_CODE RunUlfCheck(const T_ULF_OPTIONS& o)
     for (const auto& [key, item] : doc.Data().Model().ulfStageItems)
         check(item.name, CUnknownStageItemDlg(doc, key));
     if (items == 0 && !o.item.empty())
-        return Complain(EXIT_CODE::Usage,
-                        o.file + ": no unknown load factor item named \"" + o.item + "\"");
-    std::printf("%zu items, %zu findings\n", items, findings);
+        return Complain(EXIT_CODE::Usage, o.file + ": " + Say("IDS_QM_CLI_NO_ULF_ITEM", o.item));
+    std::printf(
+        "%s\n",
+        Say("IDS_QM_CLI_ULF_FINDINGS", std::to_string(items), std::to_string(findings)).c_str());
     return findings == 0 ? EXIT_CODE::Done : EXIT_CODE::NotFound;
 }
 
@@ -190,8 +198,7 @@ EXIT_CODE RunUlfSolve(const T_ULF_OPTIONS& o)
     T_ULF_OPENED in;
     if (const EXIT_CODE code = OpenItem(o, in); code != EXIT_CODE::Done) return code;
     if (in.stage && !o.shapePlot.empty())
-        return Complain(EXIT_CODE::Usage, "--shape-plot draws static load cases; the loads of " +
-                                              o.item + " act at construction stages");
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_SHAPE_PLOT_STATIC", o.item));
     if (const EXIT_CODE code = AnalyseForUlf(o.file, in); code != EXIT_CODE::Done) return code;
     const T_ULF_OUTCOME outcome = SolveUlf(*in.dialog);
     const auto& result = in.dialog->Result();
@@ -232,7 +239,7 @@ EXIT_CODE RunUlfExport(const T_ULF_OPTIONS& o)
     settings.applicationVersion = o.sheetVersion;
     settings.fileName = std::filesystem::path(o.file).filename().string();
     if (!SetDate(o.date, settings))
-        return Complain(EXIT_CODE::Usage, o.date + ": a date is YYYY-MM-DD");
+        return Complain(EXIT_CODE::Usage, o.date + ": " + Say("IDS_QM_CLI_DATE"));
     T_ULF_OPENED in;
     if (const EXIT_CODE code = OpenAndAnalyse(o, in); code != EXIT_CODE::Done) return code;
     if (const EXIT_CODE code = SolveOpened(o, in); code != EXIT_CODE::Done) return code;
@@ -241,8 +248,10 @@ EXIT_CODE RunUlfExport(const T_ULF_OPTIONS& o)
         const bool fits = UlfSheetFits(dialog.Result().constraints.size(), o.sheetVersion);
         return LastMessage(dialog, fits ? EXIT_CODE::NoAccess : EXIT_CODE::BadInput, o.file);
     }
-    std::printf("%s written: %zu constraints, %zu load cases\n", o.out.c_str(),
-                dialog.Result().constraints.size(), dialog.Result().cases.size());
+    std::printf("%s\n", Say("IDS_QM_CLI_SHEET_WRITTEN", o.out,
+                            std::to_string(dialog.Result().constraints.size()),
+                            std::to_string(dialog.Result().cases.size()))
+                            .c_str());
     return EXIT_CODE::Done;
 }
 
@@ -252,11 +261,9 @@ EXIT_CODE RunUlfCombine(const T_ULF_OPTIONS& o)
     if (const EXIT_CODE code = OpenItem(o, in); code != EXIT_CODE::Done) return code;
     if (in.stage)
         return Complain(EXIT_CODE::Usage,
-                        o.file + ": " +
-                            MMSGFunction::Format("IDS_QM_ULSI_NO_COMBINATION", {o.item}));
+                        o.file + ": " + Say("IDS_QM_ULSI_NO_COMBINATION", o.item));
     if (o.out.empty() && !IsModelFile(o.file))
-        return Complain(EXIT_CODE::Usage, o.file + ": a case file is not changed; name another "
-                                                   "file with -o");
+        return Complain(EXIT_CODE::Usage, o.file + ": " + Say("IDS_QM_CLI_CASE_NOT_CHANGED"));
     if (const EXIT_CODE code = AnalyseForUlf(o.file, in); code != EXIT_CODE::Done) return code;
     if (const EXIT_CODE code = SolveOpened(o, in); code != EXIT_CODE::Done) return code;
     CUnknownLoadFactorResultDlg dialog(in.doc, *in.dialog->Result());

@@ -7,6 +7,7 @@
 #include "qm_base/textformat.h"
 #include "qm_rps/unknownloadfactoritemdlg.h"
 #include "qm_rps/unknownstageitemdlg.h"
+#include "say.h"
 
 #include <algorithm>
 
@@ -49,12 +50,8 @@ EXIT_CODE OpenUlfItem(const std::string& file, const std::string& item, bool sum
     int key = 0, stageKey = 0;
     const bool isStatic = out.doc.Attr().FindUlfi(item, key) != 0;
     out.stage = out.doc.Attr().FindUlsi(item, stageKey) != 0;
-    const std::string quoted = "\"" + item + "\"";
     if (isStatic && out.stage)
-        return Complain(EXIT_CODE::BadInput,
-                        file + ": " + quoted +
-                            " names a static item and one of construction stages; give one of "
-                            "them another name");
+        return Complain(EXIT_CODE::BadInput, file + ": " + Say("IDS_QM_CLI_ULF_TWO_ITEMS", item));
     if (out.stage) {
         auto dialog = std::make_unique<CUnknownStageItemDlg>(out.doc, stageKey);
         dialog->m_sumStageLoads = sumStageLoads;
@@ -65,7 +62,7 @@ EXIT_CODE OpenUlfItem(const std::string& file, const std::string& item, bool sum
             out.cases.push_back(loadCase.key);
         out.dialog = std::move(dialog);
     } else {
-        return Complain(EXIT_CODE::Usage, file + ": no unknown load factor item named " + quoted);
+        return Complain(EXIT_CODE::Usage, file + ": " + Say("IDS_QM_CLI_NO_ULF_ITEM", item));
     }
     return EXIT_CODE::Done;
 }
@@ -116,23 +113,31 @@ std::string UlfTables(const T_ULF_RESULT& r)
 {
     const int caseWidth =
         Widest(r.cases, r.stage ? 15 : 10, [](const T_ULF_CASE& c) { return c.name; });
-    std::string text = FormatText("%-*s %9s %16s\n", caseWidth,
-                                  r.stage ? "stage/step case" : "load case", "", "factor");
+    std::string text =
+        FormatText("%-*s %9s %16s\n", caseWidth,
+                   Say(r.stage ? "IDS_QM_CLI_STAGE_CASE" : "IDS_QM_CLI_LOAD_CASE").c_str(), "",
+                   Say("IDS_QM_CLI_FACTOR").c_str());
     for (std::size_t i = 0; i < r.cases.size(); ++i)
-        text += FormatText("%-*s %9s %16.9g\n", caseWidth, r.cases[i].name.c_str(),
-                           r.cases[i].unknown ? "unknown" : "known", r.factors[i] + 0.0);
+        text +=
+            FormatText("%-*s %9s %16.9g\n", caseWidth, r.cases[i].name.c_str(),
+                       Say(r.cases[i].unknown ? "IDS_QM_CLI_UNKNOWN" : "IDS_QM_CLI_KNOWN").c_str(),
+                       r.factors[i] + 0.0);
     const auto rows = UlfResultRows(r);
     const auto nameOf = [](const T_ULF_RESULT_ROW& row) { return UlfNameAt(row.name, row.place); };
     const int width = Widest(rows, 10, nameOf);
-    text += FormatText("\n%-*s %15s %15s %15s %13s  %s\n", width, "constraint", "value", "lower",
-                       "upper", "missed by", "state");
+    text += FormatText("\n%-*s %15s %15s %15s %13s  %s\n", width,
+                       Say("IDS_QM_CLI_CONSTRAINT").c_str(), Say("IDS_QM_CLI_VALUE").c_str(),
+                       Say("IDS_QM_CLI_LOWER").c_str(), Say("IDS_QM_CLI_UPPER").c_str(),
+                       Say("IDS_QM_CLI_MISSED_BY").c_str(), Say("IDS_QM_CLI_STATE").c_str());
     for (std::size_t i = 0; i < rows.size(); ++i) {
         const T_ULF_RESULT_ROW& row = rows[i];
         const double scale = UlfScale(r, i);
-        const char* const state = !row.met ? "not met" : row.active ? "active" : "-";
+        const std::string state = !row.met     ? Say("IDS_QM_CLI_NOT_MET")
+                                  : row.active ? Say("IDS_QM_CLI_ACTIVE")
+                                               : "-";
         text += FormatText("%-*s %15.7g %15s %15s %13.3g  %s\n", width, nameOf(row).c_str(),
                            UlfShown(row.value, scale), Short(row.lower).c_str(),
-                           Short(row.upper).c_str(), UlfShown(row.residual, scale), state);
+                           Short(row.upper).c_str(), UlfShown(row.residual, scale), state.c_str());
     }
-    return text + FormatText("\nobjective %.9g\n", UlfObjective(r));
+    return text + "\n" + Say("IDS_QM_CLI_OBJECTIVE", FormatText("%.9g", UlfObjective(r))) + "\n";
 }

@@ -5,6 +5,7 @@
 #include "qm_base/textformat.h"
 #include "qm_db/filectrl.h"
 #include "qm_rps/pushovercurvedlg.h"
+#include "say.h"
 #include "json/resultjson.h"
 
 #include <nlohmann/json.hpp>
@@ -77,7 +78,9 @@ bool PrintRow(const json& check, CCases& cases)
     const bool within = std::fabs(difference) <= precision * (1.0 + 1e-9);
     const std::string why = check.value("explanation", std::string());
     const bool good = std::isfinite(ours) && (within || !why.empty());
-    const std::string note = within ? "" : good ? why : "**not explained**";
+    const std::string note = within ? ""
+                             : good ? why
+                                    : "**" + Say("IDS_QM_CLI_NOT_EXPLAINED") + "**";
     std::printf("%s", FormatText("| %s | %s | %s | %.2g | %.9g | %.2g | %s |\n",
                                  check.at("source").get<std::string>().c_str(),
                                  check.at("quantity").get<std::string>().c_str(),
@@ -98,13 +101,14 @@ EXIT_CODE RunVerify(const std::string& folder)
     const json document = json::parse(text, nullptr, false);
     if (document.is_discarded() || !document.contains("checks"))
         return ReportFileError(
-            {FILE_FAULT::BadInput, folder + "/checks.json: not a list of checks"});
+            {FILE_FAULT::BadInput, folder + "/checks.json: " + Say("IDS_QM_CLI_NO_CHECKS")});
     CCases cases(folder);
-    std::printf("| source | quantity | reference | precision | qm_rps | difference | remark |\n"
-                "|---|---|---|---|---|---|---|\n");
+    std::printf("%s\n|---|---|---|---|---|---|---|\n", Say("IDS_QM_CLI_VERIFY_HEAD").c_str());
     int bad = 0;
     for (const json& check : document.at("checks"))
         bad += PrintRow(check, cases) ? 0 : 1;
-    std::printf("\n%zu values, %d unexplained\n", document.at("checks").size(), bad);
+    std::printf("\n%s\n", Say("IDS_QM_CLI_VERIFY_COUNTS",
+                              std::to_string(document.at("checks").size()), std::to_string(bad))
+                              .c_str());
     return bad == 0 ? EXIT_CODE::Done : EXIT_CODE::NotFound;
 }

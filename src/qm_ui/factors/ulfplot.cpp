@@ -1,11 +1,14 @@
 #include "qm_ui/factors/ulfplot.h"
 
+#include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 
 #include <algorithm>
 #include <array>
 #include <cmath>
 #include <limits>
+
+using zql::lib::MMSGFunction;
 
 namespace {
 
@@ -17,15 +20,15 @@ constexpr double kNan = std::numeric_limits<double>::quiet_NaN();
 enum KIND : std::size_t { kWithin, kActive, kTarget, kViolated, kKinds };
 
 struct T_KIND_STYLE {
-    const char* name;
+    const char* key;
     T_PLOT_COLOR color;
     PLOT_MARKER marker;
 };
 constexpr std::array<T_KIND_STYLE, kKinds> kStyles{{
-    {"within its bounds", {95, 140, 200}, PLOT_MARKER::None},
-    {"on a bound (active)", {200, 120, 0}, PLOT_MARKER::Square},
-    {"equality: deviation from target", {30, 120, 70}, PLOT_MARKER::Circle},
-    {"not met", {190, 40, 30}, PLOT_MARKER::Cross},
+    {"IDS_QM_PLOT_WITHIN", {95, 140, 200}, PLOT_MARKER::None},
+    {"IDS_QM_PLOT_ON_BOUND", {200, 120, 0}, PLOT_MARKER::Square},
+    {"IDS_QM_PLOT_EQUALITY", {30, 120, 70}, PLOT_MARKER::Circle},
+    {"IDS_QM_PLOT_NOT_MET", {190, 40, 30}, PLOT_MARKER::Cross},
 }};
 
 bool IsEquality(const T_ULF_BAR& b)
@@ -55,9 +58,12 @@ double FromBound(const T_ULF_BAR& b, double bound)
 std::string BoundText(const T_ULF_BAR& b)
 {
     if (IsEquality(b)) return FormatText(", = %.4g", *b.upper);
-    if (b.upper && b.lower) return FormatText(", %.4g to %.4g", *b.lower, *b.upper);
-    if (b.upper) return FormatText(", at most %.4g", *b.upper);
-    return b.lower ? FormatText(", at least %.4g", *b.lower) : std::string();
+    const auto text = [](double v) { return FormatText("%.4g", v); };
+    if (b.upper && b.lower)
+        return ", " + MMSGFunction::Format("IDS_QM_PLOT_FROM_TO", {text(*b.lower), text(*b.upper)});
+    if (b.upper) return ", " + MMSGFunction::Format("IDS_QM_PLOT_AT_MOST", {text(*b.upper)});
+    return b.lower ? ", " + MMSGFunction::Format("IDS_QM_PLOT_AT_LEAST", {text(*b.lower)})
+                   : std::string();
 }
 
 std::string ValueText(const T_ULF_BAR& b)
@@ -73,7 +79,7 @@ void AddSegment(T_PLOT_SERIES& s, double x1, double y1, double x2, double y2)
     s.y.insert(s.y.end(), {y1, y2, kNan});
 }
 
-T_PLOT_SERIES Series(const char* name, double width, T_PLOT_COLOR color)
+T_PLOT_SERIES Series(const std::string& name, double width, T_PLOT_COLOR color)
 {
     T_PLOT_SERIES s;
     s.name = name;
@@ -88,7 +94,7 @@ T_PLOT_SERIES Series(const char* name, double width, T_PLOT_COLOR color)
 void AddKind(T_PLOT& plot, const std::vector<T_ULF_BAR>& bars, KIND kind)
 {
     const T_KIND_STYLE& style = kStyles[kind];
-    T_PLOT_SERIES line = Series(style.name, 9.0, style.color);
+    T_PLOT_SERIES line = Series(MMSGFunction::GetValue(style.key), 9.0, style.color);
     T_PLOT_SERIES ends = Series("", 0.0, style.color);
     ends.line = PLOT_LINE::None;
     ends.marker = style.marker;
@@ -108,7 +114,8 @@ void AddKind(T_PLOT& plot, const std::vector<T_ULF_BAR>& bars, KIND kind)
 void AddBounds(T_PLOT& plot, const std::vector<T_ULF_BAR>& bars)
 {
     constexpr double kHalf = 0.36; // of a row
-    T_PLOT_SERIES marks = Series("bound or target", 2.2, {30, 30, 30});
+    T_PLOT_SERIES marks =
+        Series(MMSGFunction::GetValue("IDS_QM_PLOT_BOUND_OR_TARGET"), 2.2, {30, 30, 30});
     for (std::size_t i = 0; i < bars.size(); ++i) {
         const double y = static_cast<double>(bars.size() - 1 - i);
         const auto mark = [&](double x) { AddSegment(marks, x, y - kHalf, x, y + kHalf); };
@@ -139,17 +146,19 @@ T_ULF_PICTURE UlfPictureOf(const CUnknownLoadFactorResultDlg& dialog)
 {
     const T_ULF_RESULT& r = dialog.Result();
     T_ULF_PICTURE picture;
-    picture.title = "Unknown load factors: " + r.item.name;
+    picture.title = MMSGFunction::Format("IDS_QM_PLOT_ULF_TITLE", {r.item.name});
     picture.subtitle =
-        std::string(r.exact ? "solved as equations" : "optimized") + ", " + dialog.ModelTitle();
+        MMSGFunction::GetValue(r.exact ? "IDS_QM_PLOT_AS_EQUATIONS" : "IDS_QM_PLOT_OPTIMIZED") +
+        ", " + dialog.ModelTitle();
     for (const T_ULF_RESULT_ROW& row : dialog.Rows()) {
         const std::size_t i = picture.bars.size();
         picture.bars.push_back({UlfNameAt(row.name, row.place), dialog.UnitOf(i), row.value,
                                 row.upper, row.lower, row.active, !row.met, UlfScale(r, i)});
     }
     for (std::size_t i = 0; i < r.cases.size(); ++i)
-        picture.notes.push_back(FormatText("%s = %.6g%s", r.cases[i].name.c_str(), r.factors[i],
-                                           r.cases[i].unknown ? "" : " (known)"));
+        picture.notes.push_back(MMSGFunction::Format(
+            r.cases[i].unknown ? "IDS_QM_PLOT_FACTOR_IS" : "IDS_QM_PLOT_FACTOR_IS_KNOWN",
+            {r.cases[i].name, FormatText("%.6g", r.factors[i])}));
     return picture;
 }
 
@@ -171,10 +180,12 @@ T_PLOT UlfPlot(const T_ULF_PICTURE& picture)
     plot.title = picture.title;
     plot.subtitle = picture.subtitle;
     plot.notes = picture.notes;
-    plot.x.title = "Place of the value between its bounds (each row in its own scale)";
+    plot.x.title = MMSGFunction::GetValue("IDS_QM_PLOT_PLACE");
     plot.x.range = T_PLOT_RANGE{-kEdge - 0.05, kEdge + 0.05};
-    plot.x.labels = {{-1.0, "lower bound"}, {0.0, "middle, target or 0"}, {1.0, "upper bound"}};
-    plot.y.title = "Constraint";
+    plot.x.labels = {{-1.0, MMSGFunction::GetValue("IDS_QM_PLOT_LOWER_BOUND")},
+                     {0.0, MMSGFunction::GetValue("IDS_QM_PLOT_MIDDLE")},
+                     {1.0, MMSGFunction::GetValue("IDS_QM_PLOT_UPPER_BOUND")}};
+    plot.y.title = MMSGFunction::GetValue("IDS_QM_PLOT_CONSTRAINT");
     for (std::size_t i = 0; i < picture.bars.size(); ++i)
         plot.y.labels.push_back({rows - 1.0 - static_cast<double>(i), picture.bars[i].name,
                                  ValueText(picture.bars[i])});

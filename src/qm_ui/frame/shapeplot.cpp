@@ -1,10 +1,13 @@
 #include "qm_ui/frame/shapeplot.h"
 
+#include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 
 #include <algorithm>
 #include <cmath>
 #include <limits>
+
+using zql::lib::MMSGFunction;
 
 namespace {
 
@@ -181,7 +184,7 @@ T_PLOT_SERIES Wires(const T_SHAPE& shape, const T_VIEW& view, const T_SHAPE_STAT
 void AddSupports(T_PLOT& plot, const T_SHAPE& shape, const T_VIEW& view)
 {
     T_PLOT_SERIES out;
-    out.name = "Support";
+    out.name = MMSGFunction::GetValue("IDS_QM_PLOT_SUPPORT");
     out.line = PLOT_LINE::None;
     out.marker = PLOT_MARKER::Triangle;
     out.color = T_PLOT_COLOR{90, 90, 90};
@@ -195,15 +198,20 @@ std::string LargestText(const T_SHAPE& shape, const T_SHAPE_STATE& s, double siz
 {
     constexpr double kZero = 1e-12;
     const auto [length, node] = Largest(s);
-    if (!(length > kZero * size)) return s.name + ": no displacement of a node";
-    return s.name + FormatText(": largest displacement %.4g %s at node %d", length,
-                               shape.lengthUnit.c_str(), shape.nodes[node].id);
+    if (!(length > kZero * size))
+        return s.name + ": " + MMSGFunction::GetValue("IDS_QM_PLOT_NO_DISPLACEMENT");
+    return s.name + ": " +
+           MMSGFunction::Format("IDS_QM_PLOT_LARGEST_DISPLACEMENT",
+                                {FormatText("%.4g", length), shape.lengthUnit,
+                                 std::to_string(shape.nodes[node].id)});
 }
 
 void AddStates(T_PLOT& plot, const T_SHAPE& shape, const T_VIEW& view, double scale)
 {
     const std::string times =
-        shape.mode ? std::string() : FormatText(", displacements \u00d7 %.10g", scale);
+        shape.mode
+            ? std::string()
+            : ", " + MMSGFunction::Format("IDS_QM_PLOT_MAGNIFIED", {FormatText("%.10g", scale)});
     const bool alone = shape.states.size() == 1;
     double size = 0.0;
     for (const T_SHAPE_STATE& s : shape.states)
@@ -253,7 +261,7 @@ void SetAxes(T_PLOT& plot, const T_SHAPE& shape, const T_VIEW& view)
     plot.equalScales = true;
     if (view.flat < 0) {
         plot.x.bare = plot.y.bare = true;
-        plot.x.title = "Isometric projection; lengths in " + shape.lengthUnit;
+        plot.x.title = MMSGFunction::Format("IDS_QM_PLOT_ISOMETRIC", {shape.lengthUnit});
         return;
     }
     const auto title = [&](int axis) {
@@ -308,7 +316,7 @@ T_PLOT ShapePlot(const T_SHAPE& shape)
     plot.title = shape.title;
     plot.subtitle = shape.subtitle;
     T_PLOT_SERIES still = Wires(shape, view, nullptr, 0.0);
-    still.name = "Undeformed";
+    still.name = MMSGFunction::GetValue("IDS_QM_PLOT_UNDEFORMED");
     still.width = 0.9;
     still.line = PLOT_LINE::Solid;
     still.color = T_PLOT_COLOR{140, 140, 140};

@@ -1,8 +1,11 @@
 #include "qm_ui/hinge/hingeplot.h"
 
+#include "qm_base/msgfunction.h"
 #include "qm_rps/hinge/hingepreview.h"
 
 #include <array>
+
+using zql::lib::MMSGFunction;
 
 namespace {
 
@@ -30,19 +33,20 @@ T_PLOT HingeBackbonePlot(const T_PHGT_D& type, HINGE_COMPONENT component, const 
     const auto c = static_cast<std::size_t>(component);
     const bool moment = component >= HINGE_COMPONENT::Mx;
     T_PLOT plot;
-    plot.title = "Hinge type " + type.name + ", " + kComponentNames[c];
+    plot.title = MMSGFunction::Format("IDS_QM_PLOT_HINGE", {type.name, kComponentNames[c]});
     plot.subtitle = page;
     T_HINGE_PREVIEW preview;
     if (!BackboneOf(curve, type.components[c].type, preview)) {
-        plot.notes.push_back("The curve has no shape yet: strengths or deformations are missing.");
+        plot.notes.push_back(MMSGFunction::GetValue("IDS_QM_PLOT_NO_SHAPE"));
         return plot;
     }
-    plot.x.title = preview.plasticAxis
-                       ? std::string("Plastic deformation") + (moment ? " (rad)" : " (length)")
-                       : std::string("D / Dy (-)");
+    plot.x.title = !preview.plasticAxis
+                       ? std::string("D / Dy (-)")
+                       : MMSGFunction::GetValue(moment ? "IDS_QM_PLOT_PLASTIC_TURN"
+                                                       : "IDS_QM_PLOT_PLASTIC_MOVE");
     plot.y.title = moment ? "M / My (-)" : "F / Fy (-)";
     T_PLOT_SERIES line;
-    line.name = "Backbone";
+    line.name = MMSGFunction::GetValue("IDS_QM_PLOT_BACKBONE");
     line.width = 2.4;
     line.color = kBlack;
     line.line = PLOT_LINE::Solid;
@@ -54,7 +58,7 @@ T_PLOT HingeBackbonePlot(const T_PHGT_D& type, HINGE_COMPONENT component, const 
     }
     plot.series.push_back(std::move(line));
     T_PLOT_SERIES marks;
-    marks.name = "Acceptance criteria";
+    marks.name = MMSGFunction::GetValue("IDS_QM_PLOT_ACCEPTANCE");
     marks.line = PLOT_LINE::None;
     marks.marker = PLOT_MARKER::Triangle;
     marks.color = kRed;
@@ -64,7 +68,8 @@ T_PLOT HingeBackbonePlot(const T_PHGT_D& type, HINGE_COMPONENT component, const 
         plot.labels.push_back({p.x, p.y, p.label, PLOT_MARKER::None, false});
     }
     if (!marks.x.empty()) plot.series.push_back(std::move(marks));
-    if (preview.schematicGap) plot.notes.push_back("The gap is drawn to no scale.");
+    if (preview.schematicGap)
+        plot.notes.push_back(MMSGFunction::GetValue("IDS_QM_PLOT_GAP_NO_SCALE"));
     return plot;
 }
 
@@ -72,10 +77,10 @@ T_PLOT HingeInteractionPlot(const T_PHGT_D& type, const T_YIELD_LEVEL& level,
                             const std::string& what)
 {
     T_PLOT plot;
-    plot.title = "Hinge type " + type.name + ", interaction";
+    plot.title = MMSGFunction::Format("IDS_QM_PLOT_INTERACTION", {type.name});
     plot.subtitle = what;
     plot.x.title = "M / MY,max (-)";
-    plot.y.title = "P / Pmax, compression positive (-)";
+    plot.y.title = MMSGFunction::GetValue("IDS_QM_PLOT_AXIAL_RATIO");
     for (const T_CURVE_ROW& row : kCurves) {
         const T_YIELD_AXIS& axis = level.*row.axis;
         if (!axis.used) continue;
@@ -95,9 +100,9 @@ T_PLOT HingeInteractionPlot(const T_PHGT_D& type, const T_YIELD_LEVEL& level,
 T_PLOT UserInteractionPlot(const T_PHGT_D& type, const T_PMM_TABLE& table)
 {
     T_PLOT plot;
-    plot.title = "Hinge type " + type.name + ", interaction of the user";
+    plot.title = MMSGFunction::Format("IDS_QM_PLOT_USER_INTERACTION", {type.name});
     plot.x.title = "M / Mmax (-)";
-    plot.y.title = "P / Pmax, compression positive (-)";
+    plot.y.title = MMSGFunction::GetValue("IDS_QM_PLOT_AXIAL_RATIO");
     for (std::size_t i = 0; i < table.curves.size(); ++i) {
         T_PLOT_SERIES s;
         s.name = i == 0 ? "Py-My" : "Pz-Mz";

@@ -1,5 +1,7 @@
 #include "qm_ui/plot/plot.h"
 
+#include "qm_base/msgfunction.h"
+
 #include <QColor>
 #include <QFont>
 #include <QFontMetricsF>
@@ -278,7 +280,9 @@ void DrawArea(QPainter& painter, const T_PLOT& plot, const T_PLOT_LAYOUT& layout
     DrawLabels(painter, plot, layout);
     DrawLegend(painter, plot, layout);
     if (!layout.hasData)
-        DrawText(painter, {"no data", layout.area, 16.0, false, PLOT_ALIGN::Center, false},
+        DrawText(painter,
+                 {zql::lib::MMSGFunction::GetValue("IDS_QM_PLOT_NO_DATA"), layout.area, 16.0, false,
+                  PLOT_ALIGN::Center, false},
                  {150, 150, 150});
 }
 
