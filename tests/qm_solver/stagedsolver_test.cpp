@@ -11,25 +11,6 @@ constexpr auto kBeam = ELEMENT_KIND::Beam;
 constexpr auto kTruss = ELEMENT_KIND::Truss;
 constexpr double kE = 2.1e8, kA = 5.4e-3, kIy = 3.7e-5, kEI = kE * kIy;
 
-T_LOAD_CASE Weight()
-{
-    T_LOAD_CASE load;
-    load.selfWeight = {0, 0, -1};
-    return load;
-}
-T_LOAD_CASE At(std::size_t node, T_VEC6 force)
-{
-    T_LOAD_CASE load;
-    load.nodal.push_back({node, force});
-    return load;
-}
-T_LOAD_CASE Tension(std::size_t element, double force)
-{
-    T_LOAD_CASE load;
-    load.pretension.push_back({element, force});
-    return load;
-}
-
 // ---- balanced cantilever ------------------------------------------------------------------------
 
 constexpr std::size_t kSegments = 5; // on each side of the pier
@@ -101,52 +82,6 @@ TEST(StagedSolver, SegmentsBornToDesignDeflectAsIfBuiltAtOnce)
         const double x = kSegment * double(i);
         const double sag = kWeight * x * x * (6 * L * L - 4 * L * x + x * x) / (24 * kEI);
         EXPECT_NEAR(-sag, r.displacement[2 * i][2], 1e-12) << i;
-    }
-}
-
-TEST(StagedSolver, AClosedBridgeCarriesAsCantileversWhatItCarriedBefore)
-{
-    // Arms of 6 from two clamps 14 apart, w on them; then the closure, and p on the whole:
-    // clamp w a2 / 2 + p L2 / 12, mid-span p L2 / 24, arms' ends w a4 / 8EI + p x2 (L - x)2 / 24EI.
-    constexpr double a = 6.0, L = 14.0, w = 12.0, p = 5.0;
-    T_STAGED_MODEL model;
-    model.frame = Empty();
-    for (const double x : {0.0, a, L - a, L})
-        AddNode(model.frame, {x, 0, 0});
-    FixAll(model.frame, 0);
-    FixAll(model.frame, 3);
-    for (const std::size_t n : {0, 2, 1}) // the closure last
-        Join(model.frame, kBeam, n, n + 1);
-    model.groups = {LOAD_GROUP::Dead, LOAD_GROUP::Dead};
-    model.stages.resize(3);
-    model.stages[0].activateElements = {0, 1};
-    model.stages[0].activateSupports = {{0, {}}, {3, {}}};
-    model.stages[0].activateLoads = {{0, kFirstStep}};
-    model.stages[1].activateElements = {2};
-    model.stages[2].activateLoads = {{1, kFirstStep}};
-    std::vector<T_LOAD_CASE> cases(2);
-    const auto load = [](std::size_t e, double value) {
-        T_BEAM_LOAD q;
-        q.element = e;
-        q.w = {-value, -value};
-        return q;
-    };
-    for (const std::size_t e : {0, 1, 2}) {
-        if (e < 2) cases[0].beam.push_back(load(e, w));
-        cases[1].beam.push_back(load(e, p));
-    }
-    CStagedSolver staged;
-    Build(staged, model, cases);
-    T_RESULT r;
-    for (const std::size_t stage : {1, 2}) {
-        const double later = stage == 2 ? p : 0.0;
-        ASSERT_TRUE(staged.ReadSum(stage, kLastStep, STAGE_SUM::All, r));
-        EXPECT_NEAR(w * a * a / 2 + later * L * L / 12, r.force[0][0][4], 1e-9);
-        EXPECT_NEAR(-later * L * L / 24, r.force[2][2][4], 1e-9);
-        for (const std::size_t n : {1, 2})
-            EXPECT_NEAR(-w * std::pow(a, 4) / (8 * kEI) -
-                            later * a * a * (L - a) * (L - a) / (24 * kEI),
-                        r.displacement[n][2], 1e-12);
     }
 }
 
@@ -282,29 +217,6 @@ TEST(StagedSolver, ATieKeepsTheDifferenceThatItFinds)
     }
 }
 
-TEST(StagedSolver, TakingASupportAwayIsItsReactionReversed)
-{
-    T_FRAME propped = Cantilever();
-    propped.materials[0].density = 5;
-    const T_RESULT free = Solved(propped, At(1, {0, 0, -3, 0, 0, 0}));
-    Fix(propped, 2, {2});
-    const T_RESULT before = Solved(propped, At(1, {0, 0, -3, 0, 0, 0}));
-    T_FRAME alone = Cantilever();
-    const T_RESULT reversed = Solved(alone, At(2, {0, 0, -before.reaction[2][2], 0, 0, 0}));
-
-    T_STAGED_MODEL model = OneStage(propped, 1);
-    T_STAGE away;
-    away.deactivateSupports = {{2, {}}};
-    model.stages.push_back(away);
-    CStagedSolver staged;
-    Build(staged, model, {At(1, {0, 0, -3, 0, 0, 0})});
-    ExpectSame(before, Case(staged, 0, 0), 1e-12);
-    T_RESULT after = Sum(before, reversed);
-    after.reaction[2] = {};
-    ExpectSame(after, Case(staged, 1, 0), 1e-12);
-    ExpectSame(free, Case(staged, 1, 0), 1e-12);
-}
-
 TEST(StagedSolver, TakingAnElementAwayReleasesItsForces)
 {
     T_FRAME whole = Cantilever();
@@ -377,81 +289,6 @@ TEST(StagedSolver, SumsTakeTheCasesOfTheirGroup)
         ASSERT_TRUE(staged.ReadSum(0, kLastStep, sum, r));
         EXPECT_NEAR(-force, r.reaction[0][2], 1e-9);
     }
-}
-
-// ---- against the static analysis ----------------------------------------------------------------
-
-/// A little of everything: releases, offsets, a link, a spring, a diaphragm.
-T_FRAME Mixed()
-{
-    T_FRAME frame = Empty();
-    frame.materials[0].density = 7.85;
-    frame.materials[0].alpha = 1.2e-5;
-    for (const T_VEC3 at : {T_VEC3{0, 0, 0}, {5, 0, 0}, {0, 4, 0}, {0, 0, 3}, {5, 0, 3}, {0, 4, 3}})
-        AddNode(frame, at);
-    for (const std::size_t n : {0, 1, 2})
-        FixAll(frame, n);
-    for (const std::size_t n : {0, 1, 2})
-        Join(frame, kBeam, n, n + 3);
-    Join(frame, kBeam, 3, 4);
-    Join(frame, kBeam, 3, 5);
-    frame.elements[3].releaseJ[4] = true;
-    frame.elements[4].offsetI = {0, 0.2, 0};
-    Join(frame, kTruss, 0, 4);
-    Join(frame, ELEMENT_KIND::Link, 4, 5, {100, 200, 300, 4, 5, 6});
-    Join(frame, ELEMENT_KIND::Spring, 5, 0, {10, 20, 30, 0, 0, 0});
-    frame.diaphragms.push_back({{3, 4, 5}, 2});
-    return frame;
-}
-
-std::vector<T_LOAD_CASE> MixedCases()
-{
-    T_LOAD_CASE strains = Tension(5, 30.0);
-    strains.temperature.push_back({3, 25.0});
-    strains.settlement.push_back({1, {0, 0, -0.01, 0, 0.002, 0}});
-    T_LOAD_CASE spans = At(4, {5, 6, 7, 1, 2, 3});
-    spans.beam.push_back({3, BEAM_LOAD::Distributed, true, 2, {-3, -5}, {0.1, 0.8}});
-    spans.beam.push_back({4, BEAM_LOAD::Point, false, 0, {4, 0}, {0.3, 1}});
-    return {Weight(), strains, spans};
-}
-
-TEST(StagedSolver, EverythingInOneStageIsTheStaticAnalysis)
-{
-    const std::vector<T_LOAD_CASE> cases = MixedCases();
-    const std::vector<T_RESULT> plain = Solved(Mixed(), cases);
-    CStagedSolver staged;
-    Build(staged, OneStage(Mixed(), cases.size()), cases);
-    ASSERT_EQ(cases.size(), plain.size());
-    for (std::size_t c = 0; c < cases.size(); ++c)
-        ExpectSame(plain[c], Case(staged, 0, c), 1e-12);
-}
-
-TEST(StagedSolver, LoadsAfterTheLastBirthAddTheStaticAnalysis)
-{
-    // The frame moves under its weight before the diaphragm, the truss and two beams join.
-    T_STAGED_MODEL model = OneStage(Mixed(), 3);
-    T_STAGE &first = model.stages[0], second;
-    first.activateElements = {0, 1, 2, 6, 7};
-    second.activateElements = {3, 4, 5};
-    first.activateLoads = {{0, kFirstStep}};
-    second.steps = 2;
-    second.activateLoads = {{1, 2}, {2, 2}};
-    model.stages.push_back(second);
-    const std::vector<T_LOAD_CASE> cases = MixedCases();
-    CStagedSolver staged;
-    Build(staged, model, cases);
-    for (const std::size_t c : {1, 2})
-        ExpectSame(Solved(Mixed(), cases[c]), Case(staged, 1, c), 1e-12);
-    // What was born unstressed: its own weight is all that it carries of the first case.
-    const T_RESULT weight = Case(staged, 1, 0, kFirstStep);
-    const T_RESULT columns = Case(staged, 0, 0);
-    T_FRAME whole = Mixed();
-    T_LOAD_CASE own; // of the two beams and the truss
-    const double w = whole.materials[0].density * kA * whole.gravity;
-    own.beam.push_back({3, BEAM_LOAD::Distributed, false, 2, {-w, -w}, {0, 1}});
-    own.beam.push_back({4, BEAM_LOAD::Distributed, false, 2, {-w, -w}, {0, 1}});
-    own.beam.push_back({5, BEAM_LOAD::Distributed, false, 2, {-w, -w}, {0, 1}});
-    ExpectSame(Sum(columns, Solved(whole, own)), weight, 1e-12);
 }
 
 TEST(StagedSolver, RunsAgainWithoutAnotherAnalysis)

@@ -7,6 +7,8 @@
 
 #include <gtest/gtest.h>
 
+#include <string>
+#include <utility>
 #include <vector>
 
 namespace sample {
@@ -32,6 +34,17 @@ inline T_RESULT Solved(const T_FRAME& frame, const T_LOAD_CASE& load)
     nothing.reaction.resize(frame.nodes.size());
     nothing.force.resize(frame.elements.size());
     return nothing;
+}
+
+/// The place that an error names: s stage, c load case, e element, n node, each with its index.
+inline std::string Place(const T_SOLVER_ERROR& error)
+{
+    std::string place;
+    const std::pair<char, long> parts[] = {
+        {'s', error.stage}, {'c', error.loadCase}, {'e', error.element}, {'n', error.node}};
+    for (const auto& [letter, index] : parts)
+        if (index >= 0) place += (place.empty() ? "" : " ") + (letter + std::to_string(index));
+    return place;
 }
 
 inline void FixAll(T_FRAME& frame, std::size_t node)

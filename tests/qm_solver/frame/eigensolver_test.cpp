@@ -92,12 +92,4 @@ TEST(EigenSolver, FindsEveryOneOfManyEqualEigenvalues)
     }
 }
 
-TEST(EigenSolver, GivesTheSamePairsInEveryRun)
-{
-    const MatrixXd k = sample::RandomMatrix(500, 60.0, 13), m = MatrixXd::Identity(500, 500);
-    const T_EIGENPAIRS first = Pairs(k, m, 9), second = Pairs(k, m, 9);
-    for (std::size_t i = 0; i < first.shape.size(); ++i)
-        EXPECT_NEAR(first.shape[i], second.shape[i], 1e-9);
-}
-
 } // namespace
