@@ -1,15 +1,14 @@
 // The arguments of linear analysis.
 #include "analysecommands.h"
+#include "registershared.h"
 #include "registrations.h"
-
-#include <CLI/CLI.hpp>
 
 void AddAnalyse(CLI::App& app, EXIT_CODE& code)
 {
     auto* sub =
         app.add_subcommand("analyse", "Analysis of load cases, construction stages and modes");
     auto o = std::make_shared<T_ANALYSE_OPTIONS>();
-    sub->add_option("FILE", o->file, "Model file (.qmdb) or case file (.json)")->required();
+    AddFile(sub, o->file);
     sub->add_option("--case", o->cases, "Load case or combination to show (default: all cases)");
     sub->add_option("--modes", o->modes, "Number of eigen modes to find")
         ->check(CLI::Range(1, 1000000));
@@ -20,7 +19,7 @@ void AddAnalyse(CLI::App& app, EXIT_CODE& code)
         ->needs(stage);
     sub->add_option("--load", o->load,
                     "Of the stages: sum, dead, erection or a load case (default: sum)");
-    sub->add_option("--json", o->json, "Write the results as JSON; - for standard output");
+    AddJson(sub, o->json);
     sub->add_flag("--table", o->table, "Print the tables also when the JSON goes to a file");
     sub->add_option("--plot", o->plot, "Draw the deformed shape: .svg, .png or .pdf");
     auto* plotCase =

@@ -8,6 +8,8 @@ namespace CLI {
 class App;
 }
 
+void AddModel(CLI::App& app, EXIT_CODE& code);
+void AddEvaluations(CLI::App& app, EXIT_CODE& code);
 void AddHingeCommands(CLI::App& app, EXIT_CODE& code);
 void AddCase(CLI::App& app, EXIT_CODE& code);
 void AddAnalyse(CLI::App& app, EXIT_CODE& code);

@@ -10,12 +10,6 @@ std::string Number(const std::optional<double>& v)
 {
     return v ? FormatText("%.5g", *v) : "-";
 }
-/// A text of the catalogue on a line of its own, behind so many blanks.
-template <class... ARGS>
-std::string Line(std::size_t blanks, std::string_view key, const ARGS&... args)
-{
-    return std::string(blanks, ' ') + Say(key, args...) + "\n";
-}
 std::string Step(const std::optional<int>& v)
 {
     return v ? std::to_string(*v) : "-";
@@ -179,38 +173,5 @@ std::string TraceTable(const T_PUSH_EVALUATION& e)
                            Number(t.det).c_str(), Number(t.dt).c_str(),
                            t.capped ? (" " + Say("IDS_QM_CLI_CAPPED")).c_str() : "");
     }
-    return text;
-}
-
-std::string InfoText(CDBDoc& doc)
-{
-    const T_MODEL& m = doc.Data().Model();
-    std::string text =
-        doc.Path() + "\n" + Line(2, "IDS_QM_CLI_INFO_TITLE", m.styp.title) +
-        Line(2, "IDS_QM_CLI_INFO_UNITS", NameOf(m.styp.units.force), NameOf(m.styp.units.length)) +
-        Line(2, "IDS_QM_CLI_INFO_COUNTS", std::to_string(m.nodes.size()),
-             std::to_string(m.storeys.size()), std::to_string(m.modes.size()),
-             std::to_string(m.spectra.size()), std::to_string(m.evaluations.size()));
-    for (const auto& [key, polc] : m.pushovers) {
-        const auto result = doc.Data().Content().results.find(key);
-        const int steps =
-            result != doc.Data().Content().results.end() ? result->second->StepCount() : 0;
-        text += Line(2, "IDS_QM_CLI_INFO_PUSH", polc.name, std::to_string(steps),
-                     std::to_string(polc.controlNode),
-                     kDirectionNames[static_cast<std::size_t>(polc.direction - 1)],
-                     kPatternNames[static_cast<std::size_t>(polc.patternKind)]);
-        std::array<int, 3> s{};
-        if (doc.Post().GetPoverInfo()->GetStepEC8(key, s))
-            text += Line(4, "IDS_QM_CLI_INFO_EC8", std::to_string(s[0]), std::to_string(s[1]),
-                         std::to_string(s[2]));
-        if (doc.Post().GetPoverInfo()->GetStepNTC2008(key, s))
-            text += Line(4, "IDS_QM_CLI_INFO_NTC", std::to_string(s[0]), std::to_string(s[1]),
-                         std::to_string(s[2]));
-    }
-    for (const auto& [key, spectrum] : m.spectra)
-        text += Line(2, "IDS_QM_CLI_SPECTRUM", spectrum.name);
-    for (const auto& [key, eval] : m.evaluations)
-        text += Line(2, "IDS_QM_CLI_INFO_EVALUATION", eval.name, MethodName(eval.method), eval.push,
-                     eval.spectrum);
     return text;
 }

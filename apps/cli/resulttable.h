@@ -14,6 +14,3 @@ std::string TraceTable(const T_PUSH_EVALUATION& e);
 
 /// All methods side by side, with the spread.
 std::string ComparisonTable(const T_PUSH_COMPARISON& c);
-
-/// What a document holds: title, units, counts, load cases, evaluations, stored steps.
-std::string InfoText(CDBDoc& doc);

@@ -1,4 +1,4 @@
-// The commands of qm-rps, after their arguments have been read.
+// The commands on pushover evaluations.
 #pragma once
 
 #include "exitcodes.h"
@@ -18,10 +18,6 @@ struct T_EVALUATE_OPTIONS {
     bool trace = false;
     bool noStore = false; // don't store the limit-state steps in a model file
 };
-
-EXIT_CODE RunImport(const std::string& caseFile, const std::string& modelFile);
-EXIT_CODE RunExport(const std::string& modelFile, const std::string& caseFile);
-EXIT_CODE RunInfo(const std::string& file, bool check);
 
 struct T_COMPARE_OPTIONS {
     std::string file;

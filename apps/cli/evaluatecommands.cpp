@@ -1,10 +1,8 @@
-#include "commands.h"
+#include "evaluatecommands.h"
 
 #include "inputfile.h"
 #include "output.h"
-#include "qm_db/casefile.h"
 #include "qm_db/filectrl.h"
-#include "qm_db/modelstore.h"
 #include "qm_rps/pushover/pushovercomparison.h"
 #include "qm_rps/pushover/pushoverreport.h"
 #include "qm_rps/pushovercurvedlg.h"
@@ -123,39 +121,6 @@ EXIT_CODE WriteResults(const T_EVALUATE_OPTIONS& o, const std::vector<T_PUSH_EVA
 }
 
 } // namespace
-
-EXIT_CODE RunImport(const std::string& caseFile, const std::string& modelFile)
-{
-    CDBDoc doc;
-    T_FILE_ERROR error;
-    if (!doc.ImportCase(caseFile, error)) return ReportFileError(error);
-    if (!doc.SaveModelAs(modelFile, error)) return ReportFileError(error);
-    std::printf("%s", InfoText(doc).c_str());
-    return EXIT_CODE::Done;
-}
-
-EXIT_CODE RunExport(const std::string& modelFile, const std::string& caseFile)
-{
-    CDBDoc doc;
-    if (const EXIT_CODE code = OpenInput(doc, modelFile); code != EXIT_CODE::Done) return code;
-    T_FILE_ERROR error;
-    std::string text;
-    if (!CCaseFile::Print(doc.Data().Content(), text, error)) return ReportFileError(error);
-    return WriteOutput(caseFile, text);
-}
-
-EXIT_CODE RunInfo(const std::string& file, bool check)
-{
-    if (check && IsModelFile(file)) {
-        T_FILE_ERROR error;
-        if (!CModelStore::CheckWhole(file, error)) return ReportFileError(error);
-    }
-    CDBDoc doc;
-    if (const EXIT_CODE code = OpenInput(doc, file); code != EXIT_CODE::Done) return code;
-    std::printf("%s", InfoText(doc).c_str());
-    if (check) std::printf("  %s\n", Say("IDS_QM_CLI_INFO_WHOLE").c_str());
-    return EXIT_CODE::Done;
-}
 
 EXIT_CODE RunCompare(const T_COMPARE_OPTIONS& o)
 {

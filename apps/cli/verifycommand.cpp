@@ -1,6 +1,5 @@
-#include "verify.h"
+#include "verifycommand.h"
 
-#include "commands.h"
 #include "inputfile.h"
 #include "qm_base/textformat.h"
 #include "qm_db/filectrl.h"
