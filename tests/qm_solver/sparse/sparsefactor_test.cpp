@@ -11,6 +11,7 @@
 namespace {
 
 using solver::CSparseFactor;
+using solver::T_SOLVER_REASON;
 using solver::T_SYMMETRIC_MATRIX;
 using namespace sample;
 
