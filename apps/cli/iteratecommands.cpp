@@ -8,7 +8,7 @@
 #include "qm_rps/unknownloadfactoriteranal.h"
 #include "say.h"
 #include "ulfrun.h"
-#include "json/jsonwriter.h"
+#include "json/jsontext.h"
 
 #ifdef QM_UI
 #include "qm_ui/factors/iterationplot.h"
@@ -92,7 +92,7 @@ T_END_WORDS WordsOf(const CUlfIteration& run, const T_ITERATE_OPTIONS& o, bool m
     return kEnds[0];
 }
 
-void Write(CJsonWriter& w, const T_ULF_ITER_STEP& step)
+void Write(CJsonText& w, const T_ULF_ITER_STEP& step)
 {
     w.Object(kJsonOneLine);
     w.Member("iteration", step.iteration).Member("file", step.file);
@@ -110,7 +110,7 @@ void Write(CJsonWriter& w, const T_ULF_ITER_STEP& step)
 
 std::string HistoryJson(const CUlfIteration& run, const char* status)
 {
-    CJsonWriter w(JSON_REALS::Shortest);
+    CJsonText w(JSON_REALS::Shortest);
     w.Object({1, 0});
     w.Member("status", status).Member("report", run.ReportPath());
     w.Key("history").List({2, 1, true});

@@ -4,6 +4,7 @@
 #include "output.h"
 #include "qm_db/casefile.h"
 #include "qm_db/modelstore.h"
+#include "qm_rps/pushover/pushevaluation.h"
 #include "say.h"
 
 #include <cstdio>

@@ -1,22 +1,22 @@
 #include "json/analysisjson.h"
 
-#include "json/jsonwriter.h"
+#include "json/jsontext.h"
 
 namespace {
 
 constexpr T_JSON_LAYOUT kTop{1, 0}, kCases{2, 1}, kIds{3, 2}; // ids stand so wherever they are
 
-void Write(CJsonWriter& w, double value)
+void Write(CJsonText& w, double value)
 {
     w.Value(value);
 }
 
-void Write(CJsonWriter& w, const T_DOF6& values)
+void Write(CJsonText& w, const T_DOF6& values)
 {
     w.Items(values, kJsonOneLine);
 }
 
-void Write(CJsonWriter& w, const T_BEAM_ROWS& rows)
+void Write(CJsonText& w, const T_BEAM_ROWS& rows)
 {
     w.List(kJsonOneLine);
     for (const T_DOF6& row : rows)
@@ -26,7 +26,7 @@ void Write(CJsonWriter& w, const T_BEAM_ROWS& rows)
 
 /// {ID: value}, one to a line.
 template <class T>
-void Write(CJsonWriter& w, const std::vector<T_BY_ID<T>>& rows)
+void Write(CJsonText& w, const std::vector<T_BY_ID<T>>& rows)
 {
     w.Object(kIds);
     for (const T_BY_ID<T>& row : rows) {
@@ -38,7 +38,7 @@ void Write(CJsonWriter& w, const std::vector<T_BY_ID<T>>& rows)
 
 /// {CASE: {ID: value}}.
 template <class T>
-void WriteCases(CJsonWriter& w, const char* name, const std::vector<T_SHOWN_CASE>& shown,
+void WriteCases(CJsonText& w, const char* name, const std::vector<T_SHOWN_CASE>& shown,
                 const std::vector<T_CASE_RESULTS>& results,
                 std::vector<T_BY_ID<T>> T_CASE_RESULTS::*rows)
 {
@@ -50,7 +50,7 @@ void WriteCases(CJsonWriter& w, const char* name, const std::vector<T_SHOWN_CASE
     w.End();
 }
 
-void Write(CJsonWriter& w, const T_MODE_RESULTS& mode)
+void Write(CJsonText& w, const T_MODE_RESULTS& mode)
 {
     w.Object({3, 2});
     w.Member("period", mode.period);
@@ -61,7 +61,7 @@ void Write(CJsonWriter& w, const T_MODE_RESULTS& mode)
     w.End();
 }
 
-void Write(CJsonWriter& w, const T_SHOWN_STAGE& s)
+void Write(CJsonText& w, const T_SHOWN_STAGE& s)
 {
     w.Object({2, 2});
     w.Member("step", s.choice.step);
@@ -81,7 +81,7 @@ std::string AnalysisJson(const std::vector<T_SHOWN_CASE>& shown,
                          const std::vector<T_MODE_RESULTS>& modes,
                          const std::vector<T_SHOWN_STAGE>& stages)
 {
-    CJsonWriter w(JSON_REALS::Shortest);
+    CJsonText w(JSON_REALS::Shortest);
     w.Object(kTop);
     WriteCases(w, "displacements", shown, results, &T_CASE_RESULTS::displacements);
     WriteCases(w, "reactions", shown, results, &T_CASE_RESULTS::reactions);

@@ -6,7 +6,7 @@
 
 namespace {
 
-void Write(CJsonWriter& w, const T_REPORT_STOREY& s)
+void Write(CJsonText& w, const T_REPORT_STOREY& s)
 {
     w.Object();
     w.Member("name", s.name).Member("height", s.height);
@@ -15,7 +15,7 @@ void Write(CJsonWriter& w, const T_REPORT_STOREY& s)
     w.End();
 }
 
-void Write(CJsonWriter& w, const T_REPORT_STEP& s, const std::vector<T_REPORT_STOREY>& storeys)
+void Write(CJsonText& w, const T_REPORT_STEP& s, const std::vector<T_REPORT_STOREY>& storeys)
 {
     w.Object();
     w.Member("step", s.step).Member("load_factor", s.loadFactor);
@@ -33,7 +33,7 @@ void Write(CJsonWriter& w, const T_REPORT_STEP& s, const std::vector<T_REPORT_ST
     w.End();
 }
 
-void Write(CJsonWriter& w, const T_REPORT_PUSH& p, const std::vector<T_REPORT_STOREY>& storeys)
+void Write(CJsonText& w, const T_REPORT_PUSH& p, const std::vector<T_REPORT_STOREY>& storeys)
 {
     w.Object();
     w.Member("name", p.name).Member("control_node", p.controlNode);
@@ -57,7 +57,7 @@ void Write(CJsonWriter& w, const T_REPORT_PUSH& p, const std::vector<T_REPORT_ST
 
 std::string ReportJson(const SSReportInfoRW& info)
 {
-    CJsonWriter w(JSON_REALS::WithPoint);
+    CJsonText w(JSON_REALS::WithPoint);
     w.Object();
     w.Member("title", info.title);
     w.Key("units").Object();

@@ -4,7 +4,7 @@
 
 namespace {
 
-void WriteFactors(CJsonWriter& w, const T_PUSH_EVALUATION& e)
+void WriteFactors(CJsonText& w, const T_PUSH_EVALUATION& e)
 {
     const T_PUSH_FACTORS& f = e.factors;
     w.Key("factors").Object();
@@ -14,7 +14,7 @@ void WriteFactors(CJsonWriter& w, const T_PUSH_EVALUATION& e)
     w.End();
 }
 
-void Write(CJsonWriter& w, const std::optional<T_PERF_POINT>& p)
+void Write(CJsonText& w, const std::optional<T_PERF_POINT>& p)
 {
     if (!p) return w.Value(nullptr);
     w.Object();
@@ -24,7 +24,7 @@ void Write(CJsonWriter& w, const std::optional<T_PERF_POINT>& p)
 }
 
 /// The members of a target displacement; null where its derivation did not come so far.
-void WriteMembers(CJsonWriter& w, const T_TARGET_DISP& t, bool derived)
+void WriteMembers(CJsonText& w, const T_TARGET_DISP& t, bool derived)
 {
     const struct {
         const char* key;
@@ -40,7 +40,7 @@ void WriteMembers(CJsonWriter& w, const T_TARGET_DISP& t, bool derived)
 }
 
 /// How each target displacement came about, found or not.
-void WriteDerivation(CJsonWriter& w, const T_PUSH_EVALUATION& e)
+void WriteDerivation(CJsonText& w, const T_PUSH_EVALUATION& e)
 {
     w.Key("derivation").List();
     for (std::size_t i = 0; i < e.targets.size(); ++i) {
@@ -54,7 +54,7 @@ void WriteDerivation(CJsonWriter& w, const T_PUSH_EVALUATION& e)
     w.End();
 }
 
-void WriteTarget(CJsonWriter& w, const T_PUSH_EVALUATION& e)
+void WriteTarget(CJsonText& w, const T_PUSH_EVALUATION& e)
 {
     w.Key("target");
     if (!e.IsTarget() || e.result == 0) return w.Value(nullptr);
@@ -69,7 +69,7 @@ void WriteTarget(CJsonWriter& w, const T_PUSH_EVALUATION& e)
     if (!one) w.End();
 }
 
-void WriteLimitStates(CJsonWriter& w, const T_PUSH_EVALUATION& e)
+void WriteLimitStates(CJsonText& w, const T_PUSH_EVALUATION& e)
 {
     w.Key("limit_states").List();
     for (const T_LIMIT_ROW& r : e.limitStates) {
@@ -82,7 +82,7 @@ void WriteLimitStates(CJsonWriter& w, const T_PUSH_EVALUATION& e)
     w.End();
 }
 
-void Write(CJsonWriter& w, const T_PERFPT_TRIAL& t)
+void Write(CJsonText& w, const T_PERFPT_TRIAL& t)
 {
     const auto add = [&](const char* key, const std::optional<double>& v) {
         if (v) w.Member(key, *v);
@@ -105,7 +105,7 @@ void Write(CJsonWriter& w, const T_PERFPT_TRIAL& t)
     w.End();
 }
 
-void Write(CJsonWriter& w, const T_ADDITIONAL_STEP& s)
+void Write(CJsonText& w, const T_ADDITIONAL_STEP& s)
 {
     w.Object();
     w.Member("step", s.step).Member("D", s.D).Member("V", s.V);
@@ -113,7 +113,7 @@ void Write(CJsonWriter& w, const T_ADDITIONAL_STEP& s)
     w.End();
 }
 
-void Write(CJsonWriter& w, const T_ADDITIONAL_POINT& p)
+void Write(CJsonText& w, const T_ADDITIONAL_POINT& p)
 {
     w.Object();
     w.Member("spectrum", p.spectrum).Member("status", StatusName(p.result));
@@ -126,7 +126,7 @@ void Write(CJsonWriter& w, const T_ADDITIONAL_POINT& p)
 }
 
 template <class T>
-void WriteList(CJsonWriter& w, const char* key, const std::vector<T>& items)
+void WriteList(CJsonText& w, const char* key, const std::vector<T>& items)
 {
     w.Key(key).List();
     for (const T& item : items)
@@ -134,7 +134,7 @@ void WriteList(CJsonWriter& w, const char* key, const std::vector<T>& items)
     w.End();
 }
 
-void WriteOutcome(CJsonWriter& w, const T_PUSH_EVALUATION& e)
+void WriteOutcome(CJsonText& w, const T_PUSH_EVALUATION& e)
 {
     const std::string advice = OutcomeAdvice(e.outcome);
     w.Key("outcome").Object();
@@ -150,7 +150,7 @@ void WriteOutcome(CJsonWriter& w, const T_PUSH_EVALUATION& e)
     w.End();
 }
 
-void Write(CJsonWriter& w, const T_PUSH_EVALUATION& e)
+void Write(CJsonText& w, const T_PUSH_EVALUATION& e)
 {
     w.Object();
     w.Member("name", e.eval.name).Member("push", e.eval.push);
@@ -183,7 +183,7 @@ const char* StatusName(int result)
     return kStatus[result];
 }
 
-void WriteResults(CJsonWriter& w, const std::vector<T_PUSH_EVALUATION>& results)
+void WriteResults(CJsonText& w, const std::vector<T_PUSH_EVALUATION>& results)
 {
     w.List();
     for (const T_PUSH_EVALUATION& e : results)
@@ -193,7 +193,7 @@ void WriteResults(CJsonWriter& w, const std::vector<T_PUSH_EVALUATION>& results)
 
 std::string ResultJson(const std::vector<T_PUSH_EVALUATION>& results)
 {
-    CJsonWriter w(JSON_REALS::WithPoint);
+    CJsonText w(JSON_REALS::WithPoint);
     WriteResults(w, results);
     return w.Text();
 }

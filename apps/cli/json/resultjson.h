@@ -2,13 +2,13 @@
 #pragma once
 
 #include "qm_rps/pushover/pushevaluation.h"
-#include "json/jsonwriter.h"
+#include "json/jsontext.h"
 
 #include <string>
 #include <vector>
 
 /// The list as the next value. What does not exist is null.
-void WriteResults(CJsonWriter& writer, const std::vector<T_PUSH_EVALUATION>& results);
+void WriteResults(CJsonText& writer, const std::vector<T_PUSH_EVALUATION>& results);
 
 /// The list as a text of its own. Numbers print shortest round trip; ends with a line end.
 std::string ResultJson(const std::vector<T_PUSH_EVALUATION>& results);

@@ -1,6 +1,6 @@
 #include "json/ulfjson.h"
 
-#include "json/jsonwriter.h"
+#include "json/jsontext.h"
 
 #include <array>
 
@@ -14,7 +14,7 @@ std::optional<double> Tidy(const std::optional<double>& v)
 }
 
 /// "factors" and "constraints"; empty where there is no result.
-void Write(CJsonWriter& w, const std::optional<T_ULF_RESULT>& r)
+void Write(CJsonText& w, const std::optional<T_ULF_RESULT>& r)
 {
     w.Key("factors").Object(r ? kItems : kItemsIfAny);
     for (std::size_t i = 0; r && i < r->cases.size(); ++i)
@@ -35,7 +35,7 @@ void Write(CJsonWriter& w, const std::optional<T_ULF_RESULT>& r)
 
 /// Opens the object of what holds or contradicts; the caller ends it.
 template <class T>
-void WriteLimit(CJsonWriter& w, const T& h)
+void WriteLimit(CJsonText& w, const T& h)
 {
     static constexpr std::array<const char*, 4> kNames{"target", "upper", "lower", "sign"};
     w.Object(kJsonOneLine);
@@ -47,7 +47,7 @@ void WriteLimit(CJsonWriter& w, const T& h)
 
 std::string UlfJson(const T_ULF_OUTCOME& o, const std::optional<T_ULF_RESULT>& r)
 {
-    CJsonWriter w(JSON_REALS::Shortest);
+    CJsonText w(JSON_REALS::Shortest);
     w.Object(kTop);
     w.Member("status", o.status).Member("code", o.solverCode).Member("message", o.message);
     w.Member("mode", o.exact ? "[EXACT]" : "[OPTIMIZE]");
@@ -59,7 +59,7 @@ std::string UlfJson(const T_ULF_OUTCOME& o, const std::optional<T_ULF_RESULT>& r
 
 std::string ExplainJson(const T_ULF_EXPLAINED& e)
 {
-    CJsonWriter w(JSON_REALS::Shortest);
+    CJsonText w(JSON_REALS::Shortest);
     w.Object(kTop);
     w.Member("solved", e.solved).Member("unknowns", e.unknowns);
     w.Member("rows", e.rows).Member("rank", e.rank).Member("condition", e.condition);

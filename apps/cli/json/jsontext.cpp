@@ -1,4 +1,4 @@
-#include "json/jsonwriter.h"
+#include "json/jsontext.h"
 
 #include "qm_base/textformat.h"
 
@@ -15,13 +15,13 @@ std::string Quoted(std::string_view text)
 
 } // namespace
 
-void CJsonWriter::Break(int blanks)
+void CJsonText::Break(int blanks)
 {
     m_text += '\n';
     m_text.append(static_cast<std::size_t>(blanks), ' ');
 }
 
-void CJsonWriter::Before()
+void CJsonText::Before()
 {
     const bool beside = std::exchange(m_beside, false);
     if (std::exchange(m_named, false) || m_open.empty()) return;
@@ -32,7 +32,7 @@ void CJsonWriter::Before()
     open.any = true;
 }
 
-void CJsonWriter::Open(char bracket, T_JSON_LAYOUT layout)
+void CJsonText::Open(char bracket, T_JSON_LAYOUT layout)
 {
     Before();
     m_text += bracket;
@@ -43,7 +43,7 @@ void CJsonWriter::Open(char bracket, T_JSON_LAYOUT layout)
     m_open.push_back({bracket == '{' ? '}' : ']', layout});
 }
 
-void CJsonWriter::End()
+void CJsonText::End()
 {
     const T_OPEN open = m_open.back();
     m_open.pop_back();
@@ -51,7 +51,7 @@ void CJsonWriter::End()
     m_text += open.close;
 }
 
-CJsonWriter& CJsonWriter::Key(std::string_view name)
+CJsonText& CJsonText::Key(std::string_view name)
 {
     Before();
     m_text += Quoted(name) + ": ";
@@ -59,37 +59,37 @@ CJsonWriter& CJsonWriter::Key(std::string_view name)
     return *this;
 }
 
-CJsonWriter& CJsonWriter::Beside()
+CJsonText& CJsonText::Beside()
 {
     m_beside = true;
     return *this;
 }
 
-void CJsonWriter::Value(std::nullptr_t)
+void CJsonText::Value(std::nullptr_t)
 {
     Before();
     m_text += "null";
 }
 
-void CJsonWriter::Value(bool value)
+void CJsonText::Value(bool value)
 {
     Before();
     m_text += value ? "true" : "false";
 }
 
-void CJsonWriter::Value(int value)
+void CJsonText::Value(int value)
 {
     Before();
     m_text += std::to_string(value);
 }
 
-void CJsonWriter::Value(std::size_t value)
+void CJsonText::Value(std::size_t value)
 {
     Before();
     m_text += std::to_string(value);
 }
 
-void CJsonWriter::Value(double value)
+void CJsonText::Value(double value)
 {
     Before();
     if (!std::isfinite(value))
@@ -99,7 +99,7 @@ void CJsonWriter::Value(double value)
             m_reals == JSON_REALS::Shortest ? ShortestText(value) : nlohmann::json(value).dump();
 }
 
-void CJsonWriter::Value(std::string_view text)
+void CJsonText::Value(std::string_view text)
 {
     Before();
     m_text += Quoted(text);

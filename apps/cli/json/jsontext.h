@@ -24,18 +24,18 @@ inline constexpr T_JSON_LAYOUT kJsonNested{-2, -2};  // a blank more than what i
 
 /// Values follow one another in the order of the calls; whoever opens an object or a list closes it
 /// with End. A value that does not exist, and a number that is not finite, is null.
-class CJsonWriter {
+class CJsonText {
 public:
-    explicit CJsonWriter(JSON_REALS reals) : m_reals(reals) {}
+    explicit CJsonText(JSON_REALS reals) : m_reals(reals) {}
 
     void Object(T_JSON_LAYOUT layout = kJsonNested) { Open('{', layout); }
     void List(T_JSON_LAYOUT layout = kJsonNested) { Open('[', layout); }
     void End();
 
     /// The name of the member that comes next.
-    CJsonWriter& Key(std::string_view name);
+    CJsonText& Key(std::string_view name);
     /// The next item stands on the line of the one before.
-    CJsonWriter& Beside();
+    CJsonText& Beside();
 
     void Value(std::nullptr_t);
     void Value(bool value);
@@ -56,7 +56,7 @@ public:
 
     /// Key and Value.
     template <class T>
-    CJsonWriter& Member(std::string_view name, const T& value)
+    CJsonText& Member(std::string_view name, const T& value)
     {
         Key(name).Value(value);
         return *this;
@@ -71,7 +71,7 @@ public:
         End();
     }
     template <class RANGE>
-    CJsonWriter& Items(std::string_view name, const RANGE& values, T_JSON_LAYOUT layout)
+    CJsonText& Items(std::string_view name, const RANGE& values, T_JSON_LAYOUT layout)
     {
         Key(name).Items(values, layout);
         return *this;
