@@ -2,12 +2,12 @@
 #include "hingetools.h"
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/desk/elementlist.h"
 #include "qm_rps/hinge/hingegenerator.h"
 #include "qm_rps/hinge/hingetheta.h"
 #include "qm_rps/pushoverhingelistdlg.h"
 
 #include <algorithm>
-#include <charconv>
 
 namespace {
 
@@ -83,32 +83,6 @@ bool PrintYield(const CHingeGenerator& generator, const T_PHGE_D& hinge, const T
     return whole;
 }
 
-/// Element ids of "1,2,5-9". 1 read; 0 not such a list. A range ends at the first id that the
-/// document does not have, which stays in the list to be refused.
-int ReadElements(const CDBDoc& doc, const std::string& text, std::vector<int>& ids)
-{
-    const char* at = text.data();
-    const char* const end = at + text.size();
-    const auto number = [&](int& n) {
-        const auto [stop, fault] = std::from_chars(at, end, n);
-        if (fault != std::errc() || n <= 0) return false;
-        at = stop;
-        return true;
-    };
-    for (;;) {
-        int from = 0;
-        if (!number(from)) return 0;
-        int to = from;
-        if (at != end && *at == '-' && (++at, !number(to) || to < from)) return 0;
-        for (int id = from;; ++id) {
-            ids.push_back(id);
-            if (id == to || !doc.Data().Model().elements.contains(id)) break;
-        }
-        if (at == end) return 1;
-        if (*at++ != ',') return 0;
-    }
-}
-
 /// A table with right-aligned columns under their heads.
 void PrintTable(const std::vector<std::vector<std::string>>& rows)
 {
@@ -175,12 +149,12 @@ EXIT_CODE RunHingeAssign(const T_HINGE_OPTIONS& o)
     int key = 0;
     T_PHGT_D type;
     if (const EXIT_CODE code = OpenType(doc, o, key, type); code != EXIT_CODE::Done) return code;
-    std::vector<int> elements;
-    if (!ReadElements(doc, o.elements, elements))
+    const std::optional<std::vector<int>> elements = ParseElementList(o.elements);
+    if (!elements || elements->empty())
         return Complain(EXIT_CODE::Usage,
                         "elements are a list like 1,2,5-9, not \"" + o.elements + "\"");
     T_HINGE_REFUSAL refusal;
-    if (!CHingeGenerator(doc).Generate(key, elements, refusal))
+    if (!CHingeGenerator(doc).Generate(key, *elements, refusal))
         return Complain(EXIT_CODE::BadInput, o.file + ": " + refusal.text);
     std::printf("%zu elements have hinges of type %s\n", doc.Attr().GetElemsByPhgt(key).size(),
                 type.name.c_str());

@@ -17,7 +17,7 @@ std::string Step(const std::optional<int>& v)
 
 std::size_t NameWidth(const std::vector<T_PUSH_EVALUATION>& results)
 {
-    std::size_t width = 10;
+    std::size_t width = Say("IDS_QM_CLI_EVALUATION").size();
     for (const auto& e : results)
         width = std::max(width, e.eval.name.size());
     return width;

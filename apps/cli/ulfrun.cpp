@@ -111,12 +111,11 @@ T_ULF_OUTCOME SolveUlf(CUlfItemDialog& dialog)
 
 std::string UlfTables(const T_ULF_RESULT& r)
 {
-    const int caseWidth =
-        Widest(r.cases, r.stage ? 15 : 10, [](const T_ULF_CASE& c) { return c.name; });
-    std::string text =
-        FormatText("%-*s %9s %16s\n", caseWidth,
-                   Say(r.stage ? "IDS_QM_CLI_STAGE_CASE" : "IDS_QM_CLI_LOAD_CASE").c_str(), "",
-                   Say("IDS_QM_CLI_FACTOR").c_str());
+    const std::string head = Say(r.stage ? "IDS_QM_CLI_STAGE_CASE" : "IDS_QM_CLI_LOAD_CASE");
+    const int caseWidth = Widest(r.cases, std::max(10, static_cast<int>(head.size())),
+                                 [](const T_ULF_CASE& c) { return c.name; });
+    std::string text = FormatText("%-*s %9s %16s\n", caseWidth, head.c_str(), "",
+                                  Say("IDS_QM_CLI_FACTOR").c_str());
     for (std::size_t i = 0; i < r.cases.size(); ++i)
         text +=
             FormatText("%-*s %9s %16.9g\n", caseWidth, r.cases[i].name.c_str(),

@@ -1,9 +1,11 @@
 // The files that evaluate writes: JSON, report, curve table, pictures.
 #include "program.h"
+#include "qm_base/textformat.h"
 
 #include <gtest/gtest.h>
 #include <nlohmann/json.hpp>
 #include <set>
+#include <sstream>
 
 namespace {
 
@@ -100,14 +102,64 @@ TEST(Outputs, ReportHasItsSectionsAndTheNumbersOfTheJson)
     EXPECT_EQ(41U, rows); // steps 0 to 40
 }
 
-TEST(Outputs, ItalianMessagesWithTheSameNumbers)
+/// The words of a text that are numbers.
+std::vector<double> Numbers(const std::string& text)
 {
-    const std::string file = ExampleCase("first-steps");
-    const std::string en = RunProgram({"evaluate", file}).out;
-    const T_RUN it = RunProgram({"--lang", "it", "evaluate", file});
-    EXPECT_EQ(0, it.code);
-    EXPECT_NE(en, it.out);
-    EXPECT_EQ(Lines(en)[1], Lines(it.out)[1]); // the line of the first point
+    std::vector<double> numbers;
+    std::istringstream words(text);
+    for (std::string word; words >> word;)
+        if (const auto number = ParseFinite(word)) numbers.push_back(*number);
+    return numbers;
+}
+
+TEST(Outputs, ItalianTextsWithTheSameNumbers)
+{
+    const CTempFolder folder;
+    std::string loose = ReadText(ExampleCase("tuned-beam"));
+    const std::string held = "\"restraint\": [1, 0, 1, 0, 0, 0]";
+    ASSERT_NE(std::string::npos, loose.find(held));
+    WriteText(folder / "loose.json",
+              loose.replace(loose.find(held), held.size(), "\"restraint\": [0, 0, 1, 0, 0, 0]"));
+    const struct {
+        std::vector<std::string> command;
+        std::vector<const char*> says;
+    } kRows[] = {
+        {{"evaluate", ExampleCase("first-steps"), "--trace"},
+         {"valutazione", "trovato", "domanda", "prova"}},
+        {{"info", ExampleCase("first-steps")}, {"nodi: ", "passi EC8"}},
+        {{"analyse", ExampleCase("tuned-beam")}, {"spostamenti", "reazioni (forze"}},
+        {{"ulf", "solve", ExampleCase("tuned-beam"), "--item", "PROPS"}, {"condizione", "attiva"}},
+        {{"ulf", "solve", ExampleCase("tuned-beam"), "--item", "X"}, {"nessuna voce"}},
+        {{"analyse", folder / "loose.json"}, {"libera di traslare lungo X"}}, // from the engine
+    };
+    for (const auto& row : kRows) {
+        std::vector<std::string> italian{"--lang", "it"};
+        italian.insert(italian.end(), row.command.begin(), row.command.end());
+        const T_RUN en = RunProgram(row.command), it = RunProgram(italian);
+        EXPECT_EQ(en.code, it.code) << it.err;
+        EXPECT_EQ(Numbers(en.out), Numbers(it.out)) << row.command[0];
+        for (const char* text : row.says) {
+            EXPECT_NE(std::string::npos, (it.out + it.err).find(text)) << text << it.out << it.err;
+            EXPECT_EQ(std::string::npos, (en.out + en.err).find(text)) << text;
+        }
+    }
+}
+
+TEST(Outputs, AnElementListIsTakenAsWindowsTakeIt)
+{
+    const CTempFolder folder;
+    const auto assigned = [&](const char* elements) {
+        const T_RUN run =
+            RunProgram({"hinge", "assign", ExampleCase("hinge-library"), "--type", "steel beam",
+                        "--elements", elements, "-o", folder / "a.json"});
+        return run.code == 0 ? ReadText(folder / "a.json") : std::to_string(run.code);
+    };
+    const std::string plain = assigned("2,3");
+    EXPECT_GT(plain.size(), 1000U);
+    for (const char* same : {"2, 3", "3,2", "2 - 3", "2,3,2"})
+        EXPECT_EQ(plain, assigned(same)) << same;
+    for (const char* none : {"", "2,", "3-2", "0", "a"})
+        EXPECT_EQ("2", assigned(none)) << none;
 }
 
 #ifdef QM_UI
