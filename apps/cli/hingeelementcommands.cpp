@@ -27,11 +27,10 @@ bool PrintYieldSide(const T_HINGE_ELEMENT& in, std::size_t c, SKEL_TYPE type, HI
     const T_THETA_LOOKUP lookup{&in.section, &in.material, in.memberLength};
     double deform = 0.0;
     if (yield)
-        deform = IsMoment(static_cast<int>(c))
-                     ? CHingeTheta::CalcThetaMoment(lookup, k, end, curve.initStiffness,
-                                                    side.userStiffness, *yield)
-                     : CHingeTheta::CalcThetaShear(lookup, k, end, curve.initStiffness,
-                                                   side.userStiffness, *yield);
+        deform = IsMoment(c) ? CHingeTheta::CalcThetaMoment(lookup, k, end, curve.initStiffness,
+                                                            side.userStiffness, *yield)
+                             : CHingeTheta::CalcThetaShear(lookup, k, end, curve.initStiffness,
+                                                           side.userStiffness, *yield);
     std::printf("  %s(%c) %s-end: yield strength %s (%s), yield deformation %s\n",
                 kComponentNames[c], positive ? '+' : '-', end == HINGE_LOCATION::IEnd ? "I" : "J",
                 yield ? FormatText("%.9g", *yield).c_str() : "-",

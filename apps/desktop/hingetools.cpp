@@ -1,6 +1,6 @@
 #include "hingetools.h"
 
-#include "qm_rps/hinge/hingedocument.h"
+#include "qm_rps/hingedocument.h"
 #include "qm_ui/hinge/hingeviews.h"
 
 namespace {

@@ -10,6 +10,7 @@
 
 #include "qm_base/finding.h"
 
+#include <cmath>
 #include <cstddef>
 #include <span>
 #include <type_traits>
@@ -61,4 +62,14 @@ void WalkRules(const T_RULE<DATA, HEAD> (&rows)[N], const std::type_identity_t<D
                const typename HEAD::PLACE& place, std::vector<T_FINDING>& out)
 {
     WalkRules(std::span<const T_RULE<DATA, HEAD>>(rows), data, place, out);
+}
+
+/// Comparisons of entered values for conditions; false where one is not finite.
+inline bool Below(double a, double b)
+{
+    return std::isfinite(a) && std::isfinite(b) && a < b;
+}
+inline bool NotAbove(double a, double b)
+{
+    return std::isfinite(a) && std::isfinite(b) && a <= b;
 }

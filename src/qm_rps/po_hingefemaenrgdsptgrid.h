@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_rps/hinge/hingesiderules.h"
+#include "qm_db/records.h"
 
 class CPO_HingeFEMAEnrgDsptGrid : public zql::frx::MDialog {
 public:
@@ -17,7 +17,4 @@ public:
 
     /// 0 A~B >= C >= D >= E >= 0 is not kept by a row: the rule is shown.
     int CheckData() override;
-
-    /// Rules of both rows in the order in which they are checked.
-    static T_BACKBONE_RULES Rules();
 };

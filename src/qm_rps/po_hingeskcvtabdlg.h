@@ -32,8 +32,6 @@ public:
     void OnChangeSlipInitGap(HINGE_END end, GAP_SIDES sides);
 
     std::vector<T_FINDING> Findings() const override;
-    static void CurveFindings(const T_SKEL_MULTI& curve, SKEL_TYPE type, const T_HINGE_PLACE& place,
-                              std::vector<T_FINDING>& out);
 
 private:
     HINGE_COMPONENT m_component = HINGE_COMPONENT::Fx;

@@ -1,24 +1,8 @@
 #include "qm_rps/po_hingeskcvtabeurodlg.h"
 
+#include "qm_rps/hinge/curvefindings.h"
 #include "qm_rps/hinge/hingemeasure.h"
 #include "qm_rps/hinge/hingemirror.h"
-#include "qm_rps/hinge/hingesiderules.h"
-
-namespace {
-
-using B = T_BACKBONE;
-
-// clang-format off
-const T_HINGE_RULE<B> kStiffness[] = {
-    {{kHingeRuleMessage, RULE_TEXT::Key, "IDS_RPS_PO_PHGT_Initial_Stiffness", nullptr, "sides.pos.userStiffness", HINGE_SIDE::Positive, "", " > 0"},
-     [](const B& b) { return Below(0, b.pos.userStiffness); }, [](const B& b) { return b.initStiffness == INIT_STIFFNESS::User; }},
-    {{kHingeRuleMessage, RULE_TEXT::Key, "IDS_RPS_PO_PHGT_Initial_Stiffness", nullptr, "sides.neg.userStiffness", HINGE_SIDE::Negative, "", " > 0"},
-     [](const B& b) { return Below(0, b.neg.userStiffness); },
-     [](const B& b) { return b.initStiffness == INIT_STIFFNESS::User && !b.symmetric; }},
-};
-// clang-format on
-
-} // namespace
 
 int CPO_HingeSkcvTabEuroDlg::Data2Dlg(HINGE_COMPONENT c, const T_HINGE_COMPONENT& data)
 {
@@ -69,32 +53,7 @@ int CPO_HingeSkcvTabEuroDlg::OnMeasureRdo(HINGE_END end, SKEL_MEASURE measure)
     return 1;
 }
 
-bool CPO_HingeSkcvTabEuroDlg::IsEurocodePair(const std::string& concreteCode,
-                                             const std::string& steelCode)
-{
-    return (concreteCode == "Eurocode2" || concreteCode == "Eurocode2:04") &&
-           (steelCode == "Eurocode3" || steelCode == "Eurocode3:05");
-}
-
 std::vector<T_FINDING> CPO_HingeSkcvTabEuroDlg::Findings() const
 {
-    std::vector<T_FINDING> out;
-    if (!m_data.active) return out;
-    ForEachPage(m_data, [&](HINGE_END end, const T_SKEL_CURVE& curve) {
-        if (const T_SKEL_EC8* e = std::get_if<T_SKEL_EC8>(&curve))
-            CurveFindings(*e, {static_cast<int>(m_component), end}, out);
-    });
-    return out;
-}
-
-void CPO_HingeSkcvTabEuroDlg::CurveFindings(const T_SKEL_EC8& curve, const T_HINGE_PLACE& place,
-                                            std::vector<T_FINDING>& out)
-{
-    const B b{curve.sides.pos,    curve.sides.neg, curve.symmetric,
-              curve.strengthLoss, curve.autoYield, curve.measure == SKEL_MEASURE::DDy,
-              curve.initStiffness};
-    for (const T_BACKBONE_RULES& rules :
-         {PositiveSignRules(), NegativeSignRules(), Ec8OrderRules(), AcceptanceRules(),
-          YieldStrengthRules(), T_BACKBONE_RULES(kStiffness)})
-        WalkRules(rules, b, place, out);
+    return ComponentFindings(m_component, m_data);
 }

@@ -31,13 +31,7 @@ public:
     /// by digit. 1 done; 0 no such page.
     [[nodiscard]] int OnMeasureRdo(HINGE_END end, SKEL_MEASURE measure);
 
-    /// Yield-strength code of the calculation: "Eurocode2", "Eurocode2:04" or "Eurocode3",
-    /// "Eurocode3:05".
-    static bool IsEurocodePair(const std::string& concreteCode, const std::string& steelCode);
-
     std::vector<T_FINDING> Findings() const override;
-    static void CurveFindings(const T_SKEL_EC8& curve, const T_HINGE_PLACE& place,
-                              std::vector<T_FINDING>& out);
 
 private:
     HINGE_COMPONENT m_component = HINGE_COMPONENT::Fx;

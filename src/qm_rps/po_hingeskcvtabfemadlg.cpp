@@ -2,102 +2,15 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/hinge/curvefindings.h"
 #include "qm_rps/hinge/hingemeasure.h"
 #include "qm_rps/hinge/hingemirror.h"
-#include "qm_rps/hinge/hingesiderules.h"
-#include "qm_rps/po_hingefemaenrgdsptgrid.h"
 #include "qm_rps/po_hingeskcvtabfemaaxialgrid.h"
 
 #include <algorithm>
 #include <cmath>
 
 namespace {
-
-using B = T_BACKBONE;
-using R = T_HINGE_RULE<T_BACKBONE>;
-constexpr auto kLit = RULE_TEXT::Literal;
-constexpr auto kKey = RULE_TEXT::Key;
-constexpr auto kPos = HINGE_SIDE::Positive;
-constexpr auto kNeg = HINGE_SIDE::Negative;
-
-bool InUnit(double v)
-{
-    return NotAbove(0, v) && NotAbove(v, 1);
-}
-bool HasRatio(const B& b)
-{
-    return b.fema->dcRatio.has_value();
-}
-bool UserStiffness(const B& b)
-{
-    return b.initStiffness == INIT_STIFFNESS::User;
-}
-
-// clang-format off
-const R kDcRatio[] = {
-    {{"IDS_RPS_Error_Pushove_Hinge_Properties_DC_RATIO", kLit, nullptr, nullptr, "dcRatio.pos", kPos}, [](const B& b) { return InUnit(b.fema->dcRatio->pos); }, HasRatio},
-    {{"IDS_RPS_Error_Pushove_Hinge_Properties_DC_RATIO", kLit, nullptr, nullptr, "dcRatio.neg", kNeg}, [](const B& b) { return InUnit(b.fema->dcRatio->neg); }, HasRatio},
-};
-const R kStiffness[] = {
-    {{kHingeRuleMessage, kKey, "IDS_RPS_PO_PHGT_Initial_Stiffness", nullptr, "sides.pos.userStiffness", kPos, "", " >= 0"},
-     [](const B& b) { return NotAbove(0, b.pos.userStiffness); }, UserStiffness},
-    {{kHingeRuleMessage, kKey, "IDS_RPS_PO_PHGT_Initial_Stiffness", nullptr, "sides.neg.userStiffness", kNeg, "", " >= 0"},
-     [](const B& b) { return NotAbove(0, b.neg.userStiffness); }, [](const B& b) { return UserStiffness(b) && b.asymStiffness; }},
-};
-const R kUnloading[] = {
-    {{kHingeRuleMessage, kKey, "IDS_RPS_PO_PHGT_UNLOADING_EXP", nullptr, "unloadExponent"},   [](const B& b) { return NotAbove(0, b.fema->unloadExponent); }},
-    {{kHingeRuleMessage, kKey, "IDS_RPS_PO_PHGT_UNLOADING_PRF", nullptr, "unloadProportion"}, [](const B& b) { return InUnit(b.fema->unloadProportion); }},
-};
-const R kUnloadFactor[] = {
-    {{kHingeRuleMessage, kLit, "-1.0 <= Unloading Stiffness Factor <= 1.0", nullptr, "unloadFactor"},
-     [](const B& b) { return NotAbove(-1, b.fema->unloadFactor) && NotAbove(b.fema->unloadFactor, 1); }},
-};
-// clang-format on
-
-struct T_GROUP {
-    T_BACKBONE_RULES rules;
-    bool perForce;   // for each axial force
-    bool energyOnly; // only with the energy-based model
-};
-
-/// The groups in the order in which they are checked.
-std::array<T_GROUP, 10> Groups()
-{
-    return {{{PositiveSignRules(), true, false},
-             {NegativeSignRules(), true, false},
-             {FemaOrderRules(), true, false},
-             {AcceptanceRules(), true, false},
-             {kDcRatio, false, false},
-             {YieldStrengthRules(), true, false},
-             {kStiffness, true, false},
-             {kUnloading, false, false},
-             {CPO_HingeFEMAEnrgDsptGrid::Rules(), true, true},
-             {kUnloadFactor, false, true}}};
-}
-
-B BackboneOf(const T_SKEL_FEMA& f, const T_SIDES<T_SKEL_SIDE>& s)
-{
-    return {s.pos,           s.neg,           f.symmetric,
-            f.strengthLoss,  f.autoYield,     f.measure == SKEL_MEASURE::DDy,
-            f.initStiffness, f.asymStiffness, &f,
-            f.compliance};
-}
-
-constexpr T_HINGE_HEAD kCount{"IDS_RPS_MULTI_CURVE_COUNT", kLit, nullptr, nullptr, "curves"};
-
-/// The list of curves by axial force: at least two, no force twice.
-void ListFindings(const T_SKEL_FEMA& f, const T_HINGE_PLACE& place, std::vector<T_FINDING>& out)
-{
-    if (f.curves.size() < 2) out.push_back(FindingOf(kCount, place));
-    for (std::size_t i = 0; i < f.curves.size(); ++i) {
-        const auto same = [&](const T_SKEL_AXIAL& a) { return a.axial == f.curves[i].axial; };
-        const auto end = f.curves.begin() + static_cast<std::ptrdiff_t>(i);
-        if (std::find_if(f.curves.begin(), end, same) == end) continue;
-        const std::string rule = FormatText("Axial Force %g already exists!", f.curves[i].axial);
-        T_HINGE_HEAD head{kHingeRuleMessage, kLit, rule.c_str(), nullptr, "axial"};
-        out.push_back(FindingOf(head, {place.component, place.end, static_cast<int>(i)}));
-    }
-}
 
 /// Row conversion; the odd sources of positions 2 and 8 are meant.
 void ConvertRow(double (*f)(double, double), double thetaNeg, double thetaPos,
@@ -180,29 +93,11 @@ std::vector<T_FINDING> CPO_HingeSkcvTabFemaDlg::Findings() const
 {
     std::vector<T_FINDING> out;
     for (std::size_t i = 0; i < m_components.size(); ++i) {
-        if (!m_components[i] || !m_components[i]->active) continue;
-        ForEachPage(*m_components[i], [&](HINGE_END end, const T_SKEL_CURVE& curve) {
-            if (const T_SKEL_FEMA* f = std::get_if<T_SKEL_FEMA>(&curve))
-                CurveFindings(*f, {static_cast<int>(i), end}, out);
-        });
+        if (!m_components[i]) continue;
+        const auto found = ComponentFindings(static_cast<HINGE_COMPONENT>(i), *m_components[i]);
+        out.insert(out.end(), found.begin(), found.end());
     }
     return out;
-}
-
-void CPO_HingeSkcvTabFemaDlg::CurveFindings(const T_SKEL_FEMA& curve, T_HINGE_PLACE place,
-                                            std::vector<T_FINDING>& out)
-{
-    if (curve.multiCurve) ListFindings(curve, place, out);
-    for (const T_GROUP& g : Groups()) {
-        if (g.energyOnly && !curve.energyBased) continue;
-        if (!g.perForce || !curve.multiCurve) {
-            WalkRules(g.rules, BackboneOf(curve, curve.sides), place, out);
-            continue;
-        }
-        for (std::size_t i = 0; i < curve.curves.size(); ++i)
-            WalkRules(g.rules, BackboneOf(curve, curve.curves[i].sides),
-                      {place.component, place.end, static_cast<int>(i)}, out);
-    }
 }
 
 double CPO_HingeSkcvTabFemaDlg::ConvertParamPR2DDy(double value, double thetaY)

@@ -32,9 +32,6 @@ public:
 
     /// Every rule that is not kept; CheckData shows the first one.
     std::vector<T_FINDING> Findings() const override;
-    /// The rules of one curve.
-    static void CurveFindings(const T_SKEL_FEMA& curve, T_HINGE_PLACE place,
-                              std::vector<T_FINDING>& out);
 
     /// Despite its name, D/Dy ratio to plastic deformation: (value - 1) * thetaY.
     /// 0 where |thetaY| < 1e-7.

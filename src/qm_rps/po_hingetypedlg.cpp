@@ -16,7 +16,7 @@
 
 namespace {
 
-using ENTRY = CPO_HingeTypeDlg::T_SKCV_ENTRY;
+using ENTRY = T_SKCV_ENTRY;
 
 int Position(const std::vector<ENTRY>& list, SKEL_TYPE code)
 {
@@ -39,7 +39,7 @@ int RunEditor(DLG& dlg, const CPO_HingeTypeDlg& type, HINGE_COMPONENT c)
 {
     dlg.SetView(type.View());
     dlg.m_owner = type.Owner();
-    const T_HINGE_COMPONENT& in = type.Type().components[static_cast<std::size_t>(c)];
+    const T_HINGE_COMPONENT& in = At(type.Type(), c);
     return dlg.Data2Dlg(c, in) && dlg.DoModal();
 }
 
@@ -50,6 +50,22 @@ int RunOn(DLG& dlg, const CPO_HingeTypeDlg& type)
     dlg.SetView(type.View());
     dlg.m_owner = type.Owner();
     return dlg.DoModal() && dlg.OnOK();
+}
+
+/// A part of the type with an editor of its own.
+struct T_PART_EDITOR {
+    const char* prefix; // of the fields of its findings
+    int (CPO_HingeTypeDlg::*open)();
+};
+constexpr T_PART_EDITOR kParts[] = {{"yieldSurface.", &CPO_HingeTypeDlg::OnYieldSurfaceDlgDlg},
+                                    {"pmm.", &CPO_HingeTypeDlg::OnUserInteractionDlg},
+                                    {"masonry.", &CPO_HingeTypeDlg::OnMasonryPropDlg}};
+
+const T_PART_EDITOR* PartOf(const T_FINDING& f)
+{
+    const auto at = std::ranges::find_if(
+        kParts, [&](const T_PART_EDITOR& p) { return f.field.starts_with(p.prefix); });
+    return at == std::end(kParts) ? nullptr : at;
 }
 
 } // namespace
@@ -69,12 +85,6 @@ int CPO_HingeTypeDlg::Dlg2Data(T_PHGT_D& data)
     return 1;
 }
 
-void CPO_HingeTypeDlg::SetSection(int section, int material)
-{
-    m_type.section = section;
-    m_type.sectionMaterial = material;
-}
-
 int CPO_HingeTypeDlg::OnApply()
 {
     if (!CheckData()) return 0;
@@ -91,10 +101,50 @@ void CPO_HingeTypeDlg::OnUpdate(T_HINGE_CONTEXT context)
     RefillSkcv();
 }
 
+std::vector<T_FINDING> CPO_HingeTypeDlg::Findings() const
+{
+    std::vector<T_FINDING> out;
+    if (std::ranges::find(m_otherNames, m_type.name) != m_otherNames.end())
+        out.push_back(
+            FindingOf({.message = "IDS_QM_UI_HINGE_NAME_TAKEN", .field = "name"}, T_RULE_PLACE{}));
+    for (T_FINDING& f : HingeTypeFindings(m_type, m_context))
+        out.push_back(std::move(f));
+    return out;
+}
+
+std::string CPO_HingeTypeDlg::FieldOf(const T_FINDING& f)
+{
+    if (f.part < 0 || PartOf(f)) return f.field;
+    const std::string name = kComponentNames.at(static_cast<std::size_t>(f.part));
+    return name + (f.field == "type" ? ".type" : ".curve");
+}
+
+int CPO_HingeTypeDlg::OnFinding(const T_FINDING& f)
+{
+    if (const T_PART_EDITOR* part = PartOf(f)) return (this->*part->open)();
+    if (f.part < 0) return 0;
+    m_preview.ShowFirstOf(ComponentOf(f));
+    return OnBtnSkcvProp(ComponentOf(f));
+}
+
+std::vector<ENTRY> CPO_HingeTypeDlg::CustomizeSkcvCmb(HINGE_COMPONENT c) const
+{
+    return OfferedCurves(m_type, c, m_context);
+}
+
+T_PART_STATES CPO_HingeTypeDlg::CustomizeDlgByMode() const
+{
+    return PartStates(m_type, m_context.altHysteresis);
+}
+
+std::vector<T_STIFFNESS_ROW> CPO_HingeTypeDlg::UpdateInitialStiffness(double memberLength) const
+{
+    return StiffnessRows(m_type, m_context, memberLength);
+}
+
 int CPO_HingeTypeDlg::SelectedSkcv(HINGE_COMPONENT c) const
 {
-    return Position(CustomizeSkcvCmb(m_type, c, m_context),
-                    m_type.components[static_cast<std::size_t>(c)].type);
+    return Position(CustomizeSkcvCmb(c), At(m_type, c).type);
 }
 
 void CPO_HingeTypeDlg::OnSelChangeElement(HINGE_ELEMENT element)
@@ -117,34 +167,34 @@ void CPO_HingeTypeDlg::OnSelChangeMaterial(MATL_CLASS material)
 
 void CPO_HingeTypeDlg::OnComponentCtrl(HINGE_COMPONENT c, bool active)
 {
-    At(c).active = active;
+    At(m_type, c).active = active;
 }
 
 void CPO_HingeTypeDlg::OnLocationCtrl(HINGE_COMPONENT c, HINGE_LOCATION location)
 {
-    At(c).location = location;
+    At(m_type, c).location = location;
 }
 
 void CPO_HingeTypeDlg::OnIJSymmetryRdo(HINGE_COMPONENT c, bool sameEnds)
 {
-    if (At(c).sameEnds == sameEnds) return;
-    At(c).sameEnds = sameEnds;
-    At(c).curves.J = At(c).curves.I;
+    if (At(m_type, c).sameEnds == sameEnds) return;
+    At(m_type, c).sameEnds = sameEnds;
+    At(m_type, c).curves.J = At(m_type, c).curves.I;
 }
 
 int CPO_HingeTypeDlg::OnSelChangeSkcv(HINGE_COMPONENT c, int index)
 {
-    const std::vector<ENTRY> list = CustomizeSkcvCmb(m_type, c, m_context);
+    const std::vector<ENTRY> list = CustomizeSkcvCmb(c);
     if (index < 0 || index >= static_cast<int>(list.size())) return 0;
     const ENTRY& entry = list[static_cast<std::size_t>(index)];
     if (!entry.enabled) return 0;
-    SetType(At(c), entry.code);
+    SetType(At(m_type, c), entry.code);
     return 1;
 }
 
 int CPO_HingeTypeDlg::OnBtnSkcvProp(HINGE_COMPONENT c)
 {
-    T_HINGE_COMPONENT& component = At(c);
+    T_HINGE_COMPONENT& component = At(m_type, c);
     if (component.type == SKEL_TYPE::Fema) {
         CPO_HingeSkcvTabFemaDlg dlg;
         return RunEditor(dlg, *this, c) && dlg.Dlg2Data(c, component);
@@ -167,18 +217,17 @@ void CPO_HingeTypeDlg::InitDataByDof(HINGE_COMPONENT c)
     const bool axial = c == HINGE_COMPONENT::Fx || c == HINGE_COMPONENT::Mx;
     const bool hasEnds =
         m_type.element == HINGE_ELEMENT::BeamColumn || m_type.element == HINGE_ELEMENT::Wall;
-    const bool bending = c == HINGE_COMPONENT::My || c == HINGE_COMPONENT::Mz;
     T_HINGE_COMPONENT fresh;
-    fresh.active = At(c).active;
+    fresh.active = At(m_type, c).active;
     fresh.location = axial || !hasEnds ? HINGE_LOCATION::Center : HINGE_LOCATION::BothEnds;
-    SetType(fresh, CustomizeSkcvCmb(m_type, c, m_context).front().code);
+    SetType(fresh, CustomizeSkcvCmb(c).front().code);
     for (T_SKEL_CURVE* curve : {&fresh.curves.I, &fresh.curves.J})
         std::visit(
             [&](auto& k) {
-                k.initStiffness = bending ? INIT_STIFFNESS::EI6L : INIT_STIFFNESS::Elastic;
+                k.initStiffness = IsBending(c) ? INIT_STIFFNESS::EI6L : INIT_STIFFNESS::Elastic;
             },
             *curve);
-    At(c) = fresh;
+    At(m_type, c) = fresh;
 }
 
 void CPO_HingeTypeDlg::InitDataCheckedAll()
@@ -268,25 +317,15 @@ void CPO_HingeTypeDlg::OnMasonryChk(bool on)
 
 void CPO_HingeTypeDlg::OnInfillStrutChk(bool on)
 {
-    for (T_SKEL_CURVE* curve : {&m_type.components[0].curves.I, &m_type.components[0].curves.J})
+    T_HINGE_COMPONENT& axial = At(m_type, HINGE_COMPONENT::Fx);
+    for (T_SKEL_CURVE* curve : {&axial.curves.I, &axial.curves.J})
         if (auto* f = std::get_if<T_SKEL_FEMA>(curve)) f->infillStrut = on;
 }
 
 bool CPO_HingeTypeDlg::IsInfillStrut() const
 {
-    const auto* f = std::get_if<T_SKEL_FEMA>(&m_type.components[0].curves.I);
+    const auto* f = std::get_if<T_SKEL_FEMA>(&At(m_type, HINGE_COMPONENT::Fx).curves.I);
     return f && f->infillStrut;
-}
-
-std::vector<T_FINDING> CPO_HingeTypeDlg::TypeFindings(const T_PHGT_D& type,
-                                                      const T_HINGE_CONTEXT& context)
-{
-    return HingeTypeFindings(type, context);
-}
-
-T_HINGE_COMPONENT& CPO_HingeTypeDlg::At(HINGE_COMPONENT c)
-{
-    return m_type.components[static_cast<std::size_t>(c)];
 }
 
 /// A stored curve type that is not in its list gives way to the first entry.
@@ -294,7 +333,7 @@ void CPO_HingeTypeDlg::RefillSkcv()
 {
     for (std::size_t i = 0; i < m_type.components.size(); ++i) {
         const auto c = static_cast<HINGE_COMPONENT>(i);
-        const std::vector<ENTRY> list = CustomizeSkcvCmb(m_type, c, m_context);
+        const std::vector<ENTRY> list = CustomizeSkcvCmb(c);
         if (Position(list, m_type.components[i].type) < 0)
             SetType(m_type.components[i], list.front().code);
     }

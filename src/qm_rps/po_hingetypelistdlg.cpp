@@ -1,6 +1,7 @@
 #include "qm_rps/po_hingetypelistdlg.h"
 
 #include "qm_base/msgfunction.h"
+#include "qm_rps/hinge/hingelabels.h"
 #include "qm_rps/po_hingetypedlg.h"
 
 #include <algorithm>
@@ -9,9 +10,6 @@ using zql::lib::MMSGFunction;
 
 namespace {
 
-constexpr std::array<const char*, 5> kElementKeys{
-    "IDS_RPS_PO_Element_Beam_Column", "IDS_RPS_PO_Element_Wall", "IDS_RPS_PO_Element_Truss",
-    "IDS_RPS_PO_Element_GeneralLink", "IDS_RPS_PO_Element_PointSpringSupport"};
 constexpr std::size_t kNamedUsers = 10; // a message names no more elements than these
 
 std::string Listed(const std::vector<int>& ids)
@@ -38,9 +36,7 @@ std::vector<CPO_HingeTypeListDlg::T_ROW> CPO_HingeTypeListDlg::Rows() const
 
 std::string CPO_HingeTypeListDlg::DataToStr(HINGE_ELEMENT element)
 {
-    const auto at = static_cast<std::size_t>(element);
-    return MMSGFunction::GetValue(at < kElementKeys.size() ? kElementKeys[at]
-                                                           : "IDS_PUSHOVER_Error");
+    return ElementText(element);
 }
 
 std::string CPO_HingeTypeListDlg::NameOf(int key, const std::string& name)

@@ -4,6 +4,7 @@
 #include "qm_base/checkeddialog.h"
 #include "qm_db/records.h"
 #include "qm_rps/hinge/hingelabels.h"
+#include "qm_rps/hinge/hingepartfindings.h"
 
 class CPO_HingeYieldPropDlgNew : public CCheckedDialog {
 public:
@@ -25,22 +26,16 @@ public:
     T_YIELD_SURFACE m_surface; // as edited
     bool m_showValue = false;  // IDS_RPS_Show_Value against IDS_RPS_Show_Ratio
 
-    /// All rules that are not kept. First every strength and moment > 0 (crack level, yield level;
-    /// the axial strengths belong to both axes and are always checked), then for each point
-    /// -1 < M/MY,max < 1 of (+) and (-), then along each curve P/Pmax falling on the tension side
-    /// and on the compression side. An axis that is not used is not checked. A NaN fails its rule.
-    /// They are reported under IDS_CMD_IEHP_YIELD.
+    /// See YieldSurfaceFindings.
     std::vector<T_FINDING> Findings() const override;
     /// 1 and the record holds the surface; 0 and the record is unchanged.
     int OnOK() override;
 
-    /// A level as it is shown: where findings have it, and the names of its strengths.
+    /// A level as it is shown.
     struct T_LEVEL {
-        const char* prefix;             // "crack.", "yield."
-        const char* titleKey;           // of its page
-        T_YIELD_LEVEL* level;           // of m_surface
-        const char* tension;            // "PC(t)"
-        const char *moment, *momentMax; // "MC", "MY": "MCy(+)", "MYy,max(+)"
+        T_YIELD_LEVEL_NAMES names;
+        const char* titleKey; // of its page
+        T_YIELD_LEVEL* level; // of m_surface
     };
     /// The levels of the curve type. A crack level that is missing is made.
     std::vector<T_LEVEL> Levels();

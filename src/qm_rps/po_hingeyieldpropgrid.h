@@ -2,15 +2,12 @@
 #pragma once
 
 #include "qm_db/records.h"
-#include "qm_rps/dialog/hingenumbergrid.h"
-
-/// Names of the ten points, compression side first.
-inline constexpr std::array<const char*, 10> kPmPointNames{"E(c)", "D(c)", "C(c)", "B(c)", "A(c)",
-                                                           "A(t)", "B(t)", "C(t)", "D(t)", "E(t)"};
+#include "qm_rps/dialog/numbergrid.h"
+#include "qm_rps/hinge/hingepartfindings.h"
 
 /// Ten rows; columns P and M of (+), P and M of (-); as ratios or as values (ratio times Pmax or
 /// the largest moment of that side), with 15 digits.
-class CPO_HingeYieldPropGrid : public CHingeNumberGrid {
+class CPO_HingeYieldPropGrid : public CNumberGrid {
 public:
     /// The level is not owned. aboutY: the y axis, else the z axis.
     CPO_HingeYieldPropGrid(T_YIELD_LEVEL& level, bool aboutY) : m_level(level), m_aboutY(aboutY) {}

@@ -3,7 +3,6 @@
 #include "qm_base/appbase.h"
 #include "qm_base/msgfunction.h"
 #include "qm_base/ruletable.h"
-#include "qm_rps/hinge/hingesiderules.h"
 
 #include <algorithm>
 #include <cmath>

@@ -1,38 +1,12 @@
 #include "qm_rps/pushoverhingedatatype.h"
 
-#include "qm_base/msgfunction.h"
+#include "qm_rps/hinge/curvefindings.h"
 #include "qm_rps/hinge/hingemirror.h"
 #include "qm_rps/po_hingetypelistdlg.h"
 
 #include <algorithm>
 
 namespace {
-
-using B = T_BACKBONE;
-constexpr const char* kDiagram = "IDS_PUSHOVER_Wrong_Data_in_the_Hinge_Diagram_Table_";
-constexpr const char* kAcceptance = "IDS_PUSHOVER_Wrong_Data_in_Acceptance_Criteria_";
-
-// clang-format off
-/// A is the origin: B does not lie before it, in either measure.
-const T_HINGE_RULE<B> kFromOrigin[] = {
-    {{kDiagram, RULE_TEXT::Deform, "%s(A) <= %s(B)", nullptr, "sides.pos.B.deform", HINGE_SIDE::Positive, "B"},
-     [](const B& b) { return NotAbove(0, b.pos.B.deform); }},
-    {{kDiagram, RULE_TEXT::Deform, "%s(-B) <= %s(A)", nullptr, "sides.neg.B.deform", HINGE_SIDE::Negative, "B"},
-     [](const B& b) { return NotAbove(b.neg.B.deform, 0); }, [](const B& b) { return !b.symmetric; }},
-};
-// clang-format on
-
-/// Rules of the FEMA curve under the message of a table.
-void Walk(T_BACKBONE_RULES rules, const B& data, const T_HINGE_PLACE& place, const char* key,
-          std::vector<T_FINDING>& out)
-{
-    const std::size_t first = out.size();
-    WalkRules(rules, data, place, out);
-    for (std::size_t i = first; i < out.size(); ++i) {
-        out[i].messageKey = key;
-        out[i].text = zql::lib::MMSGFunction::GetValue(key);
-    }
-}
 
 constexpr T_SKEL_POINT T_SKEL_SIDE::*kPoints[] = {&T_SKEL_SIDE::B, &T_SKEL_SIDE::C, &T_SKEL_SIDE::D,
                                                   &T_SKEL_SIDE::E};
@@ -48,7 +22,7 @@ int CPushOverHingeDataType::Data2Dlg(int key, HINGE_COMPONENT component)
         ShowMessage(fault->key, fault->text);
         return 0;
     }
-    const T_HINGE_COMPONENT& c = type->components[static_cast<std::size_t>(component)];
+    const T_HINGE_COMPONENT& c = At(*type, component);
     if (!std::holds_alternative<T_SKEL_FEMA>(c.curves.I)) return 0;
     m_key = key;
     m_component = component;
@@ -88,14 +62,13 @@ bool CPushOverHingeDataType::IsSymmetric() const
 const T_SKEL_FEMA* CPushOverHingeDataType::Shown() const
 {
     if (!m_taken) return nullptr;
-    return std::get_if<T_SKEL_FEMA>(
-        &m_type.components[static_cast<std::size_t>(m_component)].curves.I);
+    return std::get_if<T_SKEL_FEMA>(&At(m_type, m_component).curves.I);
 }
 
 void CPushOverHingeDataType::OnEdited()
 {
     if (!m_taken) return;
-    T_HINGE_COMPONENT& c = m_type.components[static_cast<std::size_t>(m_component)];
+    T_HINGE_COMPONENT& c = At(m_type, m_component);
     c = MirroredComponent(c);
 }
 
@@ -109,8 +82,7 @@ std::string CPushOverHingeDataType::PointField(std::size_t row)
 T_SKEL_FEMA* CPushOverHingeDataType::Curve()
 {
     if (!m_taken) return nullptr;
-    return std::get_if<T_SKEL_FEMA>(
-        &m_type.components[static_cast<std::size_t>(m_component)].curves.I);
+    return std::get_if<T_SKEL_FEMA>(&At(m_type, m_component).curves.I);
 }
 
 T_SKEL_POINT* CPushOverHingeDataType::Point(std::size_t row)
@@ -131,20 +103,8 @@ double* CPushOverHingeDataType::Criterion(std::size_t index, bool positive)
 
 std::vector<T_FINDING> CPushOverHingeDataType::Findings() const
 {
-    std::vector<T_FINDING> out;
-    if (!m_taken) return out;
-    const T_HINGE_COMPONENT& c = m_type.components[static_cast<std::size_t>(m_component)];
-    const auto& f = std::get<T_SKEL_FEMA>(c.curves.I);
-    const B data{f.sides.pos,     f.sides.neg,     f.symmetric,
-                 f.strengthLoss,  f.autoYield,     f.measure == SKEL_MEASURE::DDy,
-                 f.initStiffness, f.asymStiffness, &f,
-                 f.compliance};
-    const T_HINGE_PLACE place{static_cast<int>(m_component)};
-    for (const T_BACKBONE_RULES& rules : {PositiveSignRules(), NegativeSignRules(),
-                                          T_BACKBONE_RULES(kFromOrigin), FemaOrderRules()})
-        Walk(rules, data, place, kDiagram, out);
-    Walk(AcceptanceRules(), data, place, kAcceptance, out);
-    return out;
+    const T_SKEL_FEMA* curve = Shown();
+    return curve ? DiagramFindings(*curve, m_component) : std::vector<T_FINDING>();
 }
 
 int CPushOverHingeDataType::OnOK()
@@ -155,7 +115,7 @@ int CPushOverHingeDataType::OnOK()
         ShowMessage(fault->key, fault->text);
         return 0;
     }
-    T_HINGE_COMPONENT& c = m_type.components[static_cast<std::size_t>(m_component)];
+    T_HINGE_COMPONENT& c = At(m_type, m_component);
     c = MirroredComponent(c);
     return m_store ? m_store(m_key, m_type) : 0;
 }

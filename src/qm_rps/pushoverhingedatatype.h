@@ -6,7 +6,6 @@
 #include "qm_base/checkeddialog.h"
 #include "qm_db/records.h"
 #include "qm_rps/hinge/hingelabels.h"
-#include "qm_rps/hinge/hingesiderules.h"
 
 #include <functional>
 #include <optional>
@@ -53,8 +52,7 @@ public:
     /// A criterion of a side, or null.
     double* Criterion(std::size_t index, bool positive);
 
-    /// The diagram first: signs, deformations A <= B <= C <= D <= E, strengths; then the criteria
-    /// IO <= LS <= CP. One message key for each of the two tables.
+    /// See DiagramFindings.
     std::vector<T_FINDING> Findings() const override;
     /// Checks and stores. 0: a finding, the type is gone, or the document refused.
     [[nodiscard]] int OnOK() override;

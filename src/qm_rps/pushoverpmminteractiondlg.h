@@ -14,8 +14,7 @@ public:
 
     T_PMM_TABLE m_table; // as edited; ratios, Pmax a force
 
-    /// Along each curve neither P nor M rises (equal values pass), then Pmax >= 0; a number that is
-    /// not finite fails its rule. Keys: IDS_PUSHOVER_Wrong_Data_in_P_values, IDS_PUSHOVER_PMAX_POS.
+    /// See PmmFindings.
     std::vector<T_FINDING> Findings() const override;
     /// 1 and the record holds the table; 0 and the record is unchanged.
     int OnOK() override;

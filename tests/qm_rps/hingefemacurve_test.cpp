@@ -1,4 +1,5 @@
 #include "hingesample.h"
+#include "qm_rps/hinge/curvefindings.h"
 #include "qm_rps/po_hingeskcvtabfemaaxialgrid.h"
 #include "qm_rps/po_hingeskcvtabfemadlg.h"
 
@@ -15,7 +16,7 @@ constexpr double kNan = std::numeric_limits<double>::quiet_NaN();
 std::vector<T_FINDING> FindingsOf(const F& f, int component = 0)
 {
     std::vector<T_FINDING> out;
-    CPO_HingeSkcvTabFemaDlg::CurveFindings(f, {component, HINGE_END::Both}, out);
+    CurveFindings(f, {component}, out);
     return out;
 }
 

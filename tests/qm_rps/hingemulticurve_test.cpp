@@ -1,4 +1,5 @@
 #include "hingesample.h"
+#include "qm_rps/hinge/curvefindings.h"
 #include "qm_rps/po_hingeskcvtabdlg.h"
 #include "qm_rps/po_hingeskcvtabeurodlg.h"
 
@@ -123,7 +124,7 @@ TEST(HingeMultilinear, ReportsEachRuleOutsideItsBoundAlone)
         M m = ValidMulti();
         c.spoil(m);
         std::vector<T_FINDING> found;
-        CPO_HingeSkcvTabDlg::CurveFindings(m, c.type, {c.component, HINGE_END::Both}, found);
+        CurveFindings(m, c.type, {c.component}, found);
         EXPECT_EQ(c.rule, First(found)) << "row " << &c - kCases;
     }
 }
@@ -152,7 +153,7 @@ TEST(HingeEc8, ReportsEachRuleOutsideItsBoundAlone)
         E e = ValidBackbone<E>();
         c.spoil(e);
         std::vector<T_FINDING> found;
-        CPO_HingeSkcvTabEuroDlg::CurveFindings(e, {5, HINGE_END::Both}, found);
+        CurveFindings(e, {5}, found);
         EXPECT_EQ(c.rule, First(found)) << "row " << &c - kEc8;
     }
 }

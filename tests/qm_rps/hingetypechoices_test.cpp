@@ -12,7 +12,7 @@
 namespace {
 
 using C = HINGE_COMPONENT;
-using P = CPO_HingeTypeDlg::PART;
+using P = HINGE_PART;
 
 T_HINGE_CONTEXT Context()
 {
@@ -98,12 +98,12 @@ TEST(HingeTypeMode, FollowsElementDefinitionAndInteraction)
     EXPECT_EQ("---e-e-----e", ModeOf(t));
     t.element = HINGE_ELEMENT::PointSpring;
     EXPECT_EQ("------------", ModeOf(t));
-    EXPECT_FALSE(CPO_HingeTypeDlg::HasComponent(HINGE_ELEMENT::Truss, C::My));
+    EXPECT_FALSE(HasComponent(HINGE_ELEMENT::Truss, C::My));
 }
 
 TEST(HingeTypeLabels, NameTheModelOfABendingComponent)
 {
-    const auto label = CPO_HingeTypeDlg::HingeModelLabel;
+    const auto label = HingeModelLabel;
     EXPECT_EQ("Moment - Rotation (M-Ry)", label(HINGE_DEFINITION::MomentRotation, C::My));
     EXPECT_EQ("Moment - Curvature (M-Rz Lumped)", label(HINGE_DEFINITION::CurvatureLumped, C::Mz));
     EXPECT_EQ("Moment - Curvature (M-Rx Distributed)",
@@ -219,7 +219,7 @@ TEST(HingeTypeApply, StoresATypeThatPasses)
     T_PHGT_D stored;
     CPO_HingeTypeDlg dlg({});
     EXPECT_EQ(0, dlg.OnApply()); // no name
-    dlg.SetName("beam");
+    dlg.Edited().name = "beam";
     EXPECT_EQ(0, dlg.OnApply()); // nowhere to store
     dlg.m_store = [&](const T_PHGT_D& t) {
         stored = t;

@@ -1,4 +1,5 @@
 #include "hingesample.h"
+#include "qm_rps/hinge/hingetypefindings.h"
 #include "qm_rps/po_hingemasonrydlg.h"
 #include "qm_rps/po_hingetypedlg.h"
 #include "qm_rps/po_hingetypelistdlg.h"
@@ -50,7 +51,7 @@ TEST(HingeType, OffersCurveTypesByElementDefinitionAndOptions)
         x.concreteCode = "Eurocode2:04";
         x.steelCode = o.euro ? "Eurocode3" : "AIJ-ASD02";
         std::string codes, fourth;
-        for (const auto& e : CPO_HingeTypeDlg::CustomizeSkcvCmb(type, o.component, x)) {
+        for (const auto& e : OfferedCurves(type, o.component, x)) {
             codes += std::to_string(static_cast<int>(e.code)) + (e.enabled ? "" : "!");
             if (e.code == SKEL_TYPE::Fema) fourth = e.key;
         }
@@ -111,7 +112,7 @@ TEST(HingeType, ReportsEveryFindingAndRefusesAsAWhole)
     dlg.Data2Dlg(stored);
     EXPECT_EQ(1, dlg.CheckData());
     const auto first = [&](const T_PHGT_D& t) {
-        const auto found = CPO_HingeTypeDlg::TypeFindings(t, x);
+        const auto found = HingeTypeFindings(t, x);
         return found.empty() ? "" : found.front().messageKey;
     };
     T_PHGT_D t = ValidType();
@@ -150,7 +151,7 @@ TEST(HingeLength, FollowsCurveLocationAndOptions)
 {
     T_PHGT_D t;
     const auto state = [&](std::size_t i, bool alt) {
-        const auto s = CPO_HingeTypeDlg::GetHingeLengthEnableState(t, alt)[i];
+        const auto s = LengthNeeds(t, alt)[i];
         return std::string(s.I ? "I" : "") + (s.J ? "J" : "");
     };
     for (auto& c : t.components)

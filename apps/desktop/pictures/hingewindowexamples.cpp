@@ -2,7 +2,7 @@
 #include "hingetools.h"
 #include "mainwindow.h"
 
-#include "qm_rps/hinge/hingedocument.h"
+#include "qm_rps/hingedocument.h"
 #include "qm_rps/po_hingealphayspandlg.h"
 #include "qm_rps/po_hingeintegrationpointdlg.h"
 #include "qm_rps/po_hingelengthmphidlg.h"

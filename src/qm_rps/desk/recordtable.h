@@ -4,12 +4,9 @@
 #include "qm_base/msgfunction.h"
 #include "qm_db/editscope.h"
 #include "qm_rps/desk/recordcolumns.h"
+#include "qm_rps/dialog/unithead.h"
 
 #include <algorithm>
-
-/// The head of a column with its unit: "X (m)".
-std::string HeadWithUnit(const std::string& head, const std::optional<T_DIM>& dim,
-                         const T_UNITS& units);
 
 template <class R>
 class CRecordTable : public CRecordGrid {

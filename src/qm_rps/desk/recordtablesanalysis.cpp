@@ -3,7 +3,7 @@
 #include "qm_rps/desk/recordtable.h"
 #include "qm_rps/desk/recordtables.h"
 #include "qm_rps/factors/ulftexts.h"
-#include "qm_rps/po_hingetypelistdlg.h"
+#include "qm_rps/hinge/hingelabels.h"
 #include "qm_rps/pushover/pushevaluation.h"
 
 namespace {
@@ -126,9 +126,7 @@ std::unique_ptr<CRecordGrid> MakeHingeTypeGrid(CDBDoc& doc, const char* title)
         T_RECORD_COLUMNS<R>{
             KeyColumn<R>("IDS_QM_UI_HEAD_KEY"), NameColumn(&T_MODEL::hingeTypes, true),
             FixedColumn<R>("IDS_RPS_PO_Element_Type",
-                           [](const T_MODEL&, const R& r) {
-                               return CPO_HingeTypeListDlg::DataToStr(r.element);
-                           }),
+                           [](const T_MODEL&, const R& r) { return ElementText(r.element); }),
             FixedColumn<R>("IDS_QM_UI_HEAD_COMPONENTS", [](const T_MODEL&, const R& r) {
                 std::string names;
                 for (std::size_t i = 0; i < r.components.size(); ++i)

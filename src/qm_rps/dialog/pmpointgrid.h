@@ -2,10 +2,10 @@
 #pragma once
 
 #include "qm_db/records.h"
-#include "qm_rps/dialog/hingenumbergrid.h"
+#include "qm_rps/dialog/numbergrid.h"
 
 /// Base of the grids that show one curve. heads: of the two columns; format: of a number.
-class CPmPointGrid : public CHingeNumberGrid {
+class CPmPointGrid : public CNumberGrid {
 public:
     std::size_t Columns() const override { return 2; }
     std::string ColumnHead(std::size_t column) const override { return m_heads.at(column); }

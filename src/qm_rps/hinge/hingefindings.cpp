@@ -1,54 +1,35 @@
 #include "qm_rps/hinge/hingefindings.h"
 
-#include "qm_base/msgfunction.h"
-
-namespace {
-
-using zql::lib::MMSGFunction;
-
-std::string WithSymbol(std::string text, const char* symbol)
+std::string FieldOn(HINGE_SIDE side, std::string field)
 {
-    for (std::size_t at = 0; (at = text.find("%s", at)) != std::string::npos; ++at)
-        text.replace(at, 2, symbol);
-    return text;
+    const std::size_t at = side == HINGE_SIDE::Negative ? field.find(".pos") : std::string::npos;
+    if (at != std::string::npos) field.replace(at, 4, ".neg");
+    return field;
 }
-
-const char* SymbolOf(RULE_TEXT kind, int component)
-{
-    if (kind == RULE_TEXT::Deform) return "D";
-    return IsMoment(component) ? "M" : "F";
-}
-
-} // namespace
 
 T_FINDING FindingOf(const T_HINGE_HEAD& head, const T_HINGE_PLACE& place)
 {
-    const int component = head.component >= 0 ? head.component : place.component;
-    const char* symbol = SymbolOf(head.kind, component);
-    const char* text = IsMoment(component) && head.textMoment ? head.textMoment : head.text;
+    const bool known = place.component >= 0;
+    const auto component = static_cast<HINGE_COMPONENT>(place.component);
+    const T_SIDE_KEY& key =
+        known && IsMoment(component) && head.momentKey.pos ? head.momentKey : head.key;
+    const std::string field = FieldOn(place.side, head.field);
     const std::string list =
         place.curve < 0 ? std::string() : "curves[" + std::to_string(place.curve) + "].";
-
-    T_FINDING f;
-    f.field = place.prefix + list + head.field;
-    f.messageKey = head.messageKey;
-    f.part = component;
-    f.page = static_cast<int>(place.end);
-    f.point = *head.point ? head.point : place.point;
-    if (!text)
-        f.ruleText = head.messageKey;
-    else
-        f.ruleText = head.kind == RULE_TEXT::Key ? text : WithSymbol(text, symbol);
-    const std::string shown = head.kind == RULE_TEXT::Key && text
-                                  ? MMSGFunction::GetValue(text) + head.suffix
-                                  : f.ruleText;
-    const char* name =
-        component >= 0 && component < 6 ? kComponentNames[static_cast<std::size_t>(component)] : "";
-    f.text = MMSGFunction::Format(head.messageKey, {name, shown});
-    if (head.wordingKey)
-        f.wording = MMSGFunction::Format(
-            head.wordingKey, {WithSymbol(head.left, symbol), WithSymbol(head.right, symbol)});
-    return f;
+    T_RULE_HEAD words;
+    words.message = head.message;
+    words.text = head.text;
+    words.key = place.side == HINGE_SIDE::Negative && key.neg ? key.neg : key.pos;
+    words.suffix = head.suffix;
+    words.field = field.c_str();
+    words.point = head.point;
+    T_RULE_PLACE at;
+    if (known) at.name = kComponentNames.at(static_cast<std::size_t>(component));
+    at.prefix = place.prefix + list;
+    at.point = place.point;
+    at.part = place.component;
+    at.page = static_cast<int>(place.end);
+    return FindingOf(words, at);
 }
 
 std::string PathOnPages(const T_FINDING& f)

@@ -1,7 +1,8 @@
 #include "qm_rps/hinge/hingelabels.h"
 
 #include "qm_base/msgfunction.h"
-#include "qm_rps/desk/recordtable.h"
+#include "qm_base/textformat.h"
+#include "qm_rps/dialog/unithead.h"
 #include "qm_rps/hinge/hingefindings.h"
 
 #include <algorithm>
@@ -10,11 +11,6 @@ namespace {
 
 using zql::lib::MMSGFunction;
 
-bool Bends(HINGE_COMPONENT c)
-{
-    return c == HINGE_COMPONENT::My || c == HINGE_COMPONENT::Mz;
-}
-
 const char* ElasticText(HINGE_COMPONENT c)
 {
     if (c == HINGE_COMPONENT::Fx) return "EA/L";
@@ -22,6 +18,15 @@ const char* ElasticText(HINGE_COMPONENT c)
 }
 
 } // namespace
+
+std::string ElementText(HINGE_ELEMENT element)
+{
+    static constexpr std::array<const char*, 5> keys{
+        "IDS_RPS_PO_Element_Beam_Column", "IDS_RPS_PO_Element_Wall", "IDS_RPS_PO_Element_Truss",
+        "IDS_RPS_PO_Element_GeneralLink", "IDS_RPS_PO_Element_PointSpringSupport"};
+    const auto at = static_cast<std::size_t>(element);
+    return MMSGFunction::GetValue(at < keys.size() ? keys[at] : "IDS_PUSHOVER_Error");
+}
 
 std::string HingeHead(const std::string& name, T_DIM dim, const T_UNITS& units)
 {
@@ -37,8 +42,7 @@ std::string StrengthHead(const std::string& name, HINGE_COMPONENT c, const T_HIN
 std::string DeformHead(const std::string& name, HINGE_COMPONENT c, const T_HINGE_OWNER& owner)
 {
     const std::string head = HingeHead(name, DeformDim(c, owner.type.definition), owner.units);
-    const bool rotation =
-        IsMoment(static_cast<int>(c)) && owner.type.definition == HINGE_DEFINITION::MomentRotation;
+    const bool rotation = IsMoment(c) && owner.type.definition == HINGE_DEFINITION::MomentRotation;
     return rotation ? head + " (rad)" : head;
 }
 
@@ -54,7 +58,7 @@ std::string StiffnessHead(const std::string& name, HINGE_COMPONENT c, const T_HI
 
 const char* YieldDeformKey(HINGE_COMPONENT c, HINGE_DEFINITION definition)
 {
-    const bool moment = IsMoment(static_cast<int>(c));
+    const bool moment = IsMoment(c);
     if (definition == HINGE_DEFINITION::MomentRotation)
         return moment ? "IDS_RPS_Yield_Rotation" : "IDS_RPS_Yield_Displacement";
     return moment ? "IDS_RPS_Yield_Curvature" : "IDS_RPS_Yield_Strain";
@@ -62,14 +66,14 @@ const char* YieldDeformKey(HINGE_COMPONENT c, HINGE_DEFINITION definition)
 
 std::vector<INIT_STIFFNESS> StiffnessOptions(HINGE_COMPONENT c)
 {
-    if (!Bends(c)) return {INIT_STIFFNESS::Elastic, INIT_STIFFNESS::User};
+    if (!IsBending(c)) return {INIT_STIFFNESS::Elastic, INIT_STIFFNESS::User};
     return {INIT_STIFFNESS::EI6L, INIT_STIFFNESS::EI3L, INIT_STIFFNESS::EI2L, INIT_STIFFNESS::User};
 }
 
 std::vector<std::string> StiffnessTexts(HINGE_COMPONENT c)
 {
     const std::string user = MMSGFunction::GetValue("IDS_RPS_PUSHOVER_User");
-    if (!Bends(c)) return {ElasticText(c), user};
+    if (!IsBending(c)) return {ElasticText(c), user};
     std::vector<std::string> texts;
     for (const char* key :
          {"IDS_RPS_PO_FEMA_INIT_STIFF_ELASTIC1", "IDS_RPS_PO_FEMA_INIT_STIFF_ELASTIC2",
@@ -86,4 +90,20 @@ int StiffnessPosition(HINGE_COMPONENT c, INIT_STIFFNESS option)
     const std::vector<INIT_STIFFNESS> options = StiffnessOptions(c);
     const auto at = std::ranges::find(options, option);
     return at == options.end() ? -1 : static_cast<int>(at - options.begin());
+}
+
+std::string HingeModelLabel(HINGE_DEFINITION definition, HINGE_COMPONENT c)
+{
+    static constexpr const char* labels[] = {"Moment - Rotation (M-%s)",
+                                             "Moment - Curvature (M-%s Lumped)",
+                                             "Moment - Curvature (M-%s Distributed)"};
+    static constexpr const char* symbols[] = {"Rx", "Ry", "Rz"};
+    if (!IsMoment(c)) return {};
+    const auto symbol = static_cast<std::size_t>(c) - static_cast<std::size_t>(HINGE_COMPONENT::Mx);
+    return FormatText(labels[static_cast<std::size_t>(definition)], symbols[symbol]);
+}
+
+const char* HingeLengthCaptionKey(bool altHysteresis)
+{
+    return altHysteresis ? "IDS_RPS_PO_HINGE_LENGTH_LV" : "IDS_RPS_PO_HINGE_LENGTH_LPL";
 }

@@ -12,6 +12,9 @@ struct T_HINGE_OWNER {
     T_UNITS units;
 };
 
+/// Text of an element type; a value outside the five is shown as an error, not refused.
+std::string ElementText(HINGE_ELEMENT element);
+
 /// A key's text, or the text itself, with the unit where the quantity has one: "Span (m)".
 std::string HingeHead(const std::string& name, T_DIM dim, const T_UNITS& units);
 /// The same for a strength, a deformation (a rotation in rad) and a stiffness of a component.
@@ -28,3 +31,9 @@ std::vector<std::string> StiffnessTexts(HINGE_COMPONENT c);
 /// Position of an option in that list; -1: the component has no such. Of Fx and Mx every option
 /// but user is the elastic stiffness.
 int StiffnessPosition(HINGE_COMPONENT c, INIT_STIFFNESS option);
+
+/// "Moment - Rotation (M-%s)", "Moment - Curvature (M-%s Lumped)" or "... Distributed)" with the
+/// component's rotation symbol Rx, Ry or Rz; empty for a force.
+std::string HingeModelLabel(HINGE_DEFINITION definition, HINGE_COMPONENT c);
+/// Key of the name of a hinge length.
+const char* HingeLengthCaptionKey(bool altHysteresis);

@@ -1,6 +1,6 @@
 #include "qm_rps/hinge/hingemirror.h"
 
-#include "qm_rps/hinge/hingesiderules.h"
+#include "qm_rps/hinge/backbonerules.h"
 
 #include <type_traits>
 
@@ -35,24 +35,32 @@ struct T_MIRROR_FIELD {
 };
 using S = T_SKEL_SIDE;
 using M = T_SKEL_MULTI_SIDE;
-// clang-format off
 constexpr T_MIRROR_FIELD<S> kBackboneFields[] = {
-    {"yield", [](const S& s) { return s.yield; }},           {"yieldDeform", [](const S& s) { return s.yieldDeform; }},
-    {"B.deform", [](const S& s) { return s.B.deform; }},     {"B.strength", [](const S& s) { return s.B.strength; }},
-    {"C.deform", [](const S& s) { return s.C.deform; }},     {"C.strength", [](const S& s) { return s.C.strength; }},
-    {"D.deform", [](const S& s) { return s.D.deform; }},     {"D.strength", [](const S& s) { return s.D.strength; }},
-    {"E.deform", [](const S& s) { return s.E.deform; }},     {"E.strength", [](const S& s) { return s.E.strength; }},
-    {"IO", [](const S& s) { return s.IO; }},                 {"LS", [](const S& s) { return s.LS; }},
+    {"yield", [](const S& s) { return s.yield; }},
+    {"yieldDeform", [](const S& s) { return s.yieldDeform; }},
+    {"B.deform", [](const S& s) { return s.B.deform; }},
+    {"B.strength", [](const S& s) { return s.B.strength; }},
+    {"C.deform", [](const S& s) { return s.C.deform; }},
+    {"C.strength", [](const S& s) { return s.C.strength; }},
+    {"D.deform", [](const S& s) { return s.D.deform; }},
+    {"D.strength", [](const S& s) { return s.D.strength; }},
+    {"E.deform", [](const S& s) { return s.E.deform; }},
+    {"E.strength", [](const S& s) { return s.E.strength; }},
+    {"IO", [](const S& s) { return s.IO; }},
+    {"LS", [](const S& s) { return s.LS; }},
     {"CP", [](const S& s) { return s.CP; }},
 };
 constexpr T_MIRROR_FIELD<M> kMultiFields[] = {
-    {"P1", [](const M& s) { return s.P1; }},                 {"P2", [](const M& s) { return s.P2; }},
-    {"P3", [](const M& s) { return s.P3; }},                 {"D1", [](const M& s) { return s.D1; }},
-    {"D2", [](const M& s) { return s.D2; }},                 {"D3", [](const M& s) { return s.D3; }},
-    {"alpha1", [](const M& s) { return s.alpha1; }},         {"alpha2", [](const M& s) { return s.alpha2; }},
+    {"P1", [](const M& s) { return s.P1; }},
+    {"P2", [](const M& s) { return s.P2; }},
+    {"P3", [](const M& s) { return s.P3; }},
+    {"D1", [](const M& s) { return s.D1; }},
+    {"D2", [](const M& s) { return s.D2; }},
+    {"D3", [](const M& s) { return s.D3; }},
+    {"alpha1", [](const M& s) { return s.alpha1; }},
+    {"alpha2", [](const M& s) { return s.alpha2; }},
     {"userStiffness", [](const M& s) { return s.userStiffness; }},
 };
-// clang-format on
 
 /// Compares the stored negative side with what symmetry makes of the positive one.
 template <class SIDE, std::size_t N>
@@ -66,8 +74,9 @@ void Compare(const T_MIRROR_FIELD<SIDE> (&fields)[N], const SIDE& stored, const 
     for (const T_MIRROR_FIELD<SIDE>& f : fields) {
         if (f.value(stored) == f.value(mirrored)) continue;
         const std::string field = std::string("sides.neg.") + f.name;
-        out.push_back(FindingOf({"IDS_QM_HINGE_NOT_SYMMETRIC", RULE_TEXT::Literal, field.c_str(),
-                                 nullptr, field.c_str(), HINGE_SIDE::Negative},
+        out.push_back(FindingOf(T_HINGE_HEAD{.message = "IDS_QM_HINGE_NOT_SYMMETRIC",
+                                             .text = field.c_str(),
+                                             .field = field.c_str()},
                                 place));
     }
 }

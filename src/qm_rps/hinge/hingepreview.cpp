@@ -1,7 +1,7 @@
 #include "qm_rps/hinge/hingepreview.h"
 
+#include "qm_rps/hinge/backbonerules.h"
 #include "qm_rps/hinge/hingemeasure.h"
-#include "qm_rps/hinge/hingesiderules.h"
 
 #include <algorithm>
 #include <cmath>
@@ -94,15 +94,6 @@ void Backbone(T_SIDES<T_SKEL_SIDE> sides, bool symmetric, SKEL_MEASURE measure,
                                              std::fabs(sides.neg.yieldDeform) < kZeroTheta);
     const T_LINE neg = BackboneSide(sides.neg, -1.0, measure, out);
     out.line = Join(neg, BackboneSide(sides.pos, 1.0, measure, out));
-}
-
-bool IsTrilinear(SKEL_TYPE t)
-{
-    return t == SKEL_TYPE::Trilinear || t == SKEL_TYPE::SlipTrilinear;
-}
-bool IsSlip(SKEL_TYPE t)
-{
-    return t == SKEL_TYPE::SlipBilinear || t == SKEL_TYPE::SlipTrilinear;
 }
 
 /// Points of one side from entered deformations, normalised by the yield point.

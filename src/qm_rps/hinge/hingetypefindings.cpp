@@ -1,21 +1,13 @@
 #include "qm_rps/hinge/hingetypefindings.h"
 
+#include "qm_rps/hinge/curvefindings.h"
+#include "qm_rps/hinge/hingechoices.h"
 #include "qm_rps/hinge/hingemirror.h"
-#include "qm_rps/hinge/hingesiderules.h"
-#include "qm_rps/po_hingemasonrydlg.h"
-#include "qm_rps/po_hingeskcvtabdlg.h"
-#include "qm_rps/po_hingeskcvtabeurodlg.h"
-#include "qm_rps/po_hingeskcvtabfemadlg.h"
-#include "qm_rps/po_hingetypedlg.h"
-#include "qm_rps/po_hingeyieldpropdlgnew.h"
-#include "qm_rps/pushoverpmminteractiondlg.h"
+#include "qm_rps/hinge/hingepartfindings.h"
 
 #include <algorithm>
 
 namespace {
-
-constexpr auto kLit = RULE_TEXT::Literal;
-constexpr auto kKey = RULE_TEXT::Key;
 
 struct T_TYPE_CHECK {
     const T_PHGT_D& type;
@@ -38,61 +30,70 @@ bool HasLineElement(const T_PHGT_D& t)
     return t.element != HINGE_ELEMENT::GeneralLink && t.element != HINGE_ELEMENT::PointSpring;
 }
 
-// clang-format off
-const T_HINGE_RULE<T> kTypeRules[] = {
-    {{"IDS_QM_HINGE_NAME_EMPTY", kLit, nullptr, nullptr, "name"}, [](const T& t) { return !t.type.name.empty(); }},
-    {{"IDS_CMD_IEHP_NO_SECT", kLit, nullptr, nullptr, "section"}, [](const T& t) { return t.Section() != nullptr; },
+bool FibresFit(const T& t)
+{
+    return t.IsWall() ? CHingeSources::IsWall(*t.Fibre()) : CHingeSources::HasFibres(*t.Fibre());
+}
+bool ThicknessFits(const T& t)
+{
+    return t.IsWall() && (!t.sources || !t.Thickness() || CHingeSources::IsWall(*t.Thickness()));
+}
+bool NeedsBars(const T& t)
+{
+    return t.Calculates() && t.Section() && t.Material() &&
+           t.Material()->type == MATL_CLASS::Concrete;
+}
+
+constexpr const char* kNoSection = "IDS_CMD_IEHP_NO_SECT";
+constexpr const char* kNoWall = "IDS_CMD_IEHP_NO_WALL";
+constexpr T_RULE<T> kTypeRules[] = {
+    {{.message = "IDS_QM_HINGE_NAME_EMPTY", .field = "name"},
+     [](const T& t) { return !t.type.name.empty(); }},
+    {{.message = kNoSection, .field = "section"},
+     [](const T& t) { return t.Section() != nullptr; },
      [](const T& t) { return t.sources && (t.type.section != 0 || t.Calculates()); }},
-    {{"IDS_CMD_IEHP_NO_MATL", kLit, nullptr, nullptr, "sectionMaterial"}, [](const T& t) { return t.Material() != nullptr; },
+    {{.message = "IDS_CMD_IEHP_NO_MATL", .field = "sectionMaterial"},
+     [](const T& t) { return t.Material() != nullptr; },
      [](const T& t) { return t.sources && (t.type.sectionMaterial != 0 || t.Calculates()); }},
-    {{"IDS_CMD_IEHP_NO_SECT", kLit, nullptr, nullptr, "fibreSection"}, [](const T& t) { return t.Fibre() != nullptr; },
+    {{.message = kNoSection, .field = "fibreSection"},
+     [](const T& t) { return t.Fibre() != nullptr; },
      [](const T& t) { return t.sources && t.type.fibreSection != 0; }},
-    {{"IDS_QM_HINGE_NO_FIBRES", kLit, nullptr, nullptr, "fibreSection"}, [](const T& t) { return HasLineElement(t.type); },
+    {{.message = "IDS_QM_HINGE_NO_FIBRES", .field = "fibreSection"},
+     [](const T& t) { return HasLineElement(t.type); },
      [](const T& t) { return t.type.fibreSection != 0; }},
-    {{"IDS_QM_HINGE_FIBRE_SHAPE", kLit, nullptr, nullptr, "fibreSection"},
-     [](const T& t) { return t.IsWall() ? CHingeSources::IsWall(*t.Fibre()) : CHingeSources::HasFibres(*t.Fibre()); },
+    {{.message = "IDS_QM_HINGE_FIBRE_SHAPE", .field = "fibreSection"},
+     FibresFit,
      [](const T& t) { return t.sources && t.Fibre() && HasLineElement(t.type); }},
-    {{"IDS_CMD_IEHP_NO_SECT", kLit, nullptr, nullptr, "thicknessSection"}, [](const T& t) { return t.Thickness() != nullptr; },
+    {{.message = kNoSection, .field = "thicknessSection"},
+     [](const T& t) { return t.Thickness() != nullptr; },
      [](const T& t) { return t.sources && t.type.thicknessSection != 0; }},
-    {{"IDS_CMD_IEHP_NO_WALL", kLit, nullptr, nullptr, "thicknessSection"},
-     [](const T& t) { return t.IsWall() && (!t.sources || !t.Thickness() || CHingeSources::IsWall(*t.Thickness())); },
+    {{.message = kNoWall, .field = "thicknessSection"},
+     ThicknessFits,
      [](const T& t) { return t.type.thicknessSection != 0; }},
-    {{"IDS_CMD_IEHP_NO_WALL", kLit, nullptr, nullptr, "section"}, [](const T& t) { return CHingeSources::IsWall(*t.Section()); },
+    {{.message = kNoWall, .field = "section"},
+     [](const T& t) { return CHingeSources::IsWall(*t.Section()); },
      [](const T& t) { return t.sources && t.IsWall() && t.Section(); }},
-    {{"IDS_CMD_IEHP_NO_RBAR", kLit, nullptr, nullptr, "section"}, [](const T& t) { return !t.Section()->bars.empty(); },
-     [](const T& t) { return t.Calculates() && t.Section() && t.Material() && t.Material()->type == MATL_CLASS::Concrete; }},
+    {{.message = "IDS_CMD_IEHP_NO_RBAR", .field = "section"},
+     [](const T& t) { return !t.Section()->bars.empty(); },
+     NeedsBars},
 };
-// clang-format on
 
 /// An active component's curve type that is not offered for such a type, or not under the codes.
 void OfferFindings(const T_PHGT_D& type, const T_HINGE_CONTEXT& context, std::size_t i,
                    std::vector<T_FINDING>& out)
 {
-    const auto c = static_cast<HINGE_COMPONENT>(i);
     const SKEL_TYPE code = type.components[i].type;
-    const auto list = CPO_HingeTypeDlg::CustomizeSkcvCmb(type, c, context);
-    const auto at = std::ranges::find(list, code, &CPO_HingeTypeDlg::T_SKCV_ENTRY::code);
+    const auto list = OfferedCurves(type, static_cast<HINGE_COMPONENT>(i), context);
+    const auto at = std::ranges::find(list, code, &T_SKCV_ENTRY::code);
     if (at != list.end() && at->enabled) return;
-    const bool offered = at != list.end();
-    out.push_back(
-        FindingOf({offered ? "IDS_QM_HINGE_CURVE_CODES" : "IDS_QM_HINGE_CURVE_NOT_OFFERED", kKey,
-                   CPO_HingeTypeDlg::SkcvKey(code), nullptr, "type"},
-                  {static_cast<int>(i)}));
+    T_HINGE_HEAD head;
+    head.message = at != list.end() ? "IDS_QM_HINGE_CURVE_CODES" : "IDS_QM_HINGE_CURVE_NOT_OFFERED";
+    head.key = {CurveKey(code)};
+    head.field = "type";
+    out.push_back(FindingOf(head, {static_cast<int>(i)}));
 }
 
-void CurveFindings(SKEL_TYPE type, const T_SKEL_CURVE& curve, const T_HINGE_PLACE& place,
-                   std::vector<T_FINDING>& out)
-{
-    if (const auto* m = std::get_if<T_SKEL_MULTI>(&curve))
-        CPO_HingeSkcvTabDlg::CurveFindings(*m, type, place, out);
-    else if (const auto* f = std::get_if<T_SKEL_FEMA>(&curve))
-        CPO_HingeSkcvTabFemaDlg::CurveFindings(*f, place, out);
-    else
-        CPO_HingeSkcvTabEuroDlg::CurveFindings(std::get<T_SKEL_EC8>(curve), place, out);
-    MirrorFindings(curve, place, out);
-}
-
-/// What another editor finds, its fields as members of the type.
+/// What is found in a part, its fields as members of the type.
 void Append(const char* prefix, std::vector<T_FINDING> found, std::vector<T_FINDING>& out)
 {
     for (T_FINDING& f : found) {
@@ -103,59 +104,14 @@ void Append(const char* prefix, std::vector<T_FINDING> found, std::vector<T_FIND
 
 void PartFindings(const T_PHGT_D& type, std::vector<T_FINDING>& out)
 {
-    if (type.masonry) {
-        CPO_HingeMasonryDlg masonry;
-        masonry.Data2Dlg(*type.masonry);
-        Append("masonry.", masonry.Findings(), out);
-    }
-    if (type.yieldSurface) {
-        T_YIELD_SURFACE surface = *type.yieldSurface;
-        const SKEL_TYPE curve = CPO_HingeTypeDlg::YieldSurfaceCurve(type);
-        Append("yieldSurface.", CPO_HingeYieldPropDlgNew(surface, curve).Findings(), out);
-    }
-    if (type.pmm) {
-        T_PMM_TABLE table = *type.pmm;
-        Append("pmm.", CPushOverPMMInteractionDlg(table).Findings(), out);
-    }
+    if (type.masonry) Append("masonry.", MasonryFindings(*type.masonry), out);
+    if (type.yieldSurface)
+        Append("yieldSurface.", YieldSurfaceFindings(*type.yieldSurface, YieldSurfaceCurve(type)),
+               out);
+    if (type.pmm) Append("pmm.", PmmFindings(*type.pmm), out);
 }
-
-/// A multilinear curve whose stiffness follows from ratios, where it stands.
-struct T_RATIO_CHECK {
-    const T_SKEL_MULTI& m;
-    bool tri;
-};
-using Q = T_RATIO_CHECK;
-template <bool POS>
-const T_SKEL_MULTI_SIDE& RatioSide(const Q& q)
-{
-    return POS ? q.m.sides.pos : q.m.sides.neg;
-}
-template <bool POS>
-bool Alpha1Suits(const Q& q)
-{
-    return NotAbove(RatioSide<POS>(q).alpha1, 1);
-}
-template <bool POS>
-bool Alpha2Suits(const Q& q)
-{
-    return NotAbove(RatioSide<POS>(q).alpha2, RatioSide<POS>(q).alpha1);
-}
-constexpr const char* kAlpha = "IDS_RPS_PO_MULTI_WARNING_ALPHA";
-// clang-format off
-const T_HINGE_RULE<Q> kAlphaRules[] = {
-    {{kAlpha, kLit, "alpha1 <= 1", nullptr, "sides.pos.alpha1", HINGE_SIDE::Positive, "alpha1"}, Alpha1Suits<true>},
-    {{kAlpha, kLit, "alpha1 <= 1", nullptr, "sides.neg.alpha1", HINGE_SIDE::Negative, "alpha1"}, Alpha1Suits<false>, [](const Q& q) { return !q.m.symmetric; }},
-    {{kAlpha, kLit, "alpha2 <= alpha1", nullptr, "sides.pos.alpha2", HINGE_SIDE::Positive, "alpha2"}, Alpha2Suits<true>, [](const Q& q) { return q.tri; }},
-    {{kAlpha, kLit, "alpha2 <= alpha1", nullptr, "sides.neg.alpha2", HINGE_SIDE::Negative, "alpha2"}, Alpha2Suits<false>, [](const Q& q) { return q.tri && !q.m.symmetric; }},
-};
-// clang-format on
 
 } // namespace
-
-bool IsTrilinear(SKEL_TYPE type)
-{
-    return type == SKEL_TYPE::Trilinear || type == SKEL_TYPE::SlipTrilinear;
-}
 
 bool IsAutoYield(const T_SKEL_CURVE& curve)
 {
@@ -181,9 +137,10 @@ void AutoStrengthFindings(const T_PHGT_D& type, const CHingeSources::T_RESULT& r
                                                            : MessageKeyOf(result.fault);
         ForEachPage(c, [&](HINGE_END end, const T_SKEL_CURVE& curve) {
             if (IsAutoYield(curve))
-                out.push_back(
-                    FindingOf({"IDS_QM_HINGE_AUTO_STRENGTH", kKey, why, nullptr, "autoYield"},
-                              {static_cast<int>(i), end}));
+                out.push_back(FindingOf(T_HINGE_HEAD{.message = "IDS_QM_HINGE_AUTO_STRENGTH",
+                                                     .key = {why},
+                                                     .field = "autoYield"},
+                                        {static_cast<int>(i), end}));
         });
     }
 }
@@ -198,7 +155,9 @@ std::vector<T_FINDING> HingeTypeFindings(const T_PHGT_D& type, const T_HINGE_CON
         if (!c.active) continue;
         OfferFindings(type, context, i, out);
         ForEachPage(c, [&](HINGE_END end, const T_SKEL_CURVE& curve) {
-            CurveFindings(c.type, curve, {static_cast<int>(i), end}, out);
+            const T_HINGE_PLACE place{static_cast<int>(i), end};
+            CurveFindings(curve, c.type, place, out);
+            MirrorFindings(curve, place, out);
         });
     }
     if (check.Calculates()) {
@@ -221,7 +180,7 @@ std::vector<T_FINDING> HingeTypeWarnings(const T_PHGT_D& type)
             const auto* m = std::get_if<T_SKEL_MULTI>(&curve);
             if (!m || m->useDeformation) return;
             ++curves;
-            WalkRules(kAlphaRules, Q{*m, IsTrilinear(c.type)}, {static_cast<int>(i), end}, out);
+            RatioWarnings(*m, c.type, {static_cast<int>(i), end}, out);
         });
     }
     if (curves < 2) out.clear(); // the warning is about several curves at once

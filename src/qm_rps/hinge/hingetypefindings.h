@@ -18,7 +18,6 @@ std::vector<T_FINDING> HingeTypeWarnings(const T_PHGT_D& type);
 void AutoStrengthFindings(const T_PHGT_D& type, const CHingeSources::T_RESULT& result,
                           std::vector<T_FINDING>& out);
 
-bool IsTrilinear(SKEL_TYPE type);
 /// The strengths of the curve come from section and material.
 bool IsAutoYield(const T_SKEL_CURVE& curve);
 /// An active component of the type has such a curve in use.

@@ -2,7 +2,7 @@
 
 #include <memory>
 
-T_GRID_BINDING GridOf(CHingeNumberGrid& grid)
+T_GRID_BINDING GridOf(CNumberGrid& grid)
 {
     T_GRID_BINDING b;
     for (std::size_t c = 0; c < grid.Columns(); ++c)

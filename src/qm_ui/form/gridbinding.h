@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_rps/desk/recordgrid.h"
-#include "qm_rps/dialog/hingenumbergrid.h"
+#include "qm_rps/dialog/numbergrid.h"
 #include "qm_rps/dialog/texttable.h"
 #include "qm_ui/form/binding.h"
 
@@ -39,6 +39,6 @@ struct T_GRID_BINDING {
 /// The whole of a table of records. It must outlive the view.
 T_GRID_BINDING GridOf(CRecordGrid& grid);
 /// The whole of a number grid of the models. The grid must outlive the view.
-T_GRID_BINDING GridOf(CHingeNumberGrid& grid);
+T_GRID_BINDING GridOf(CNumberGrid& grid);
 /// A table that is only read, made again with each refresh; its number of columns stays.
 T_GRID_BINDING GridOf(std::function<T_TEXT_TABLE()> make);

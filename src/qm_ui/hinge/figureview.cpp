@@ -2,7 +2,7 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
-#include "qm_rps/desk/recordtable.h"
+#include "qm_rps/dialog/unithead.h"
 #include "qm_rps/po_femastrlossfigure0dlg.h"
 #include "qm_rps/po_femastrlossfigureedlg.h"
 #include "qm_rps/po_femaunloadstifffigureedlg.h"

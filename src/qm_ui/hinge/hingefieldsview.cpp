@@ -173,7 +173,7 @@ void AddYieldCells(CFormView& form, const T_BACKBONE_PAGE& page)
     form.EndCells();
 }
 
-CFormField& MarkedGrid(CFormView& form, std::shared_ptr<CHingeNumberGrid> grid,
+CFormField& MarkedGrid(CFormView& form, std::shared_ptr<CNumberGrid> grid,
                        T_FINDINGS_OF_PASS findings, std::string prefix)
 {
     T_GRID_BINDING b = GridOf(*grid);

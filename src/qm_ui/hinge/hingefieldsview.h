@@ -77,5 +77,5 @@ void AddYieldCells(CFormView& form, const T_BACKBONE_PAGE& page);
 /// A number grid whose cells are marked by the findings that name them. prefix: of their fields.
 /// The findings are those of the form's last pass.
 using T_FINDINGS_OF_PASS = std::shared_ptr<std::vector<T_FINDING>>;
-CFormField& MarkedGrid(CFormView& form, std::shared_ptr<CHingeNumberGrid> grid,
+CFormField& MarkedGrid(CFormView& form, std::shared_ptr<CNumberGrid> grid,
                        T_FINDINGS_OF_PASS findings, std::string prefix);

@@ -27,7 +27,7 @@ T_FINDINGS_OF_PASS KeepFindings(CFormView& form, DLG& dlg)
 /// Strengths and moments of a level, named as its rules name them.
 void AddStrengths(CFormView& form, SURFACE& dlg, const SURFACE::T_LEVEL& level)
 {
-    const std::string prefix = level.prefix;
+    const std::string prefix = level.names.prefix;
     const T_UNITS units = dlg.m_owner.units;
     const auto force = [&](const char* name, const char* field, double& value) {
         form.Note([=] { return HingeHead(name, kDimForce, units); });
@@ -37,7 +37,7 @@ void AddStrengths(CFormView& form, SURFACE& dlg, const SURFACE::T_LEVEL& level)
     const auto moments = [&](bool aboutY, bool largest) {
         T_YIELD_AXIS& axis = aboutY ? level.level->y : level.level->z;
         T_SIDES<double>& m = largest ? axis.momentMax : axis.moment;
-        const std::string name = std::string(largest ? level.momentMax : level.moment) +
+        const std::string name = std::string(largest ? level.names.momentMax : level.names.moment) +
                                  (aboutY ? "y" : "z") + (largest ? ",max" : "");
         const std::string field =
             prefix + (aboutY ? "y." : "z.") + (largest ? "momentMax." : "moment.");
@@ -47,7 +47,7 @@ void AddStrengths(CFormView& form, SURFACE& dlg, const SURFACE::T_LEVEL& level)
         Set(form.Number(PlainLabel(name + "(-)"), Ref(m.neg)), field + "neg", used);
     };
     form.Cells({{}, PlainLabel("(+)"), PlainLabel("(-)")});
-    force(level.tension, "tension", level.level->tension);
+    force(level.names.tension, "tension", level.level->tension);
     force("Pmax(c)", "compression", level.level->compression);
     for (const bool aboutY : {true, false})
         for (const bool largest : {false, true})
@@ -71,8 +71,8 @@ void AddGrid(CFormView& form, SURFACE& dlg, const SURFACE::T_LEVEL& level, bool 
             grid->m_showValue = dlg.m_showValue;
             return !dlg.IsAxisUsed(aboutY);
         });
-    Set(MarkedGrid(form, grid, findings, level.prefix),
-        std::string(level.prefix) + (aboutY ? "y." : "z.") + "curves",
+    Set(MarkedGrid(form, grid, findings, level.names.prefix),
+        std::string(level.names.prefix) + (aboutY ? "y." : "z.") + "curves",
         [&dlg, aboutY] { return dlg.IsAxisUsed(aboutY); });
 }
 

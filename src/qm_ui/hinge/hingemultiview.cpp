@@ -152,9 +152,7 @@ T_BINDING<bool> FlagOf(const P& p, bool T_SKEL_MULTI::*member)
 
 void AddPage(CFormView& form, const P& p)
 {
-    form.Note([p] {
-        return zql::lib::MMSGFunction::GetValue(CPO_HingeTypeDlg::SkcvKey(p.dlg.Component().type));
-    });
+    form.Note([p] { return zql::lib::MMSGFunction::GetValue(CurveKey(p.dlg.Component().type)); });
     AutoYieldChoice(form, [p]() -> bool& { return p.Curve().autoYield; }).name =
         p.prefix + "autoYield";
     StiffnessChoice(form, p.dlg.Which(),

@@ -1,6 +1,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_rps/hinge/hingetypefindings.h"
 #include "qm_rps/po_hingetypelistdlg.h"
+#include "qm_rps/pushoverhingelistdlg.h"
 #include "qm_ui/hinge/hingefieldsview.h"
 #include "qm_ui/hinge/hingeplot.h"
 #include "qm_ui/hinge/hingeviews.h"
@@ -9,7 +10,7 @@ namespace {
 
 using zql::lib::MMSGFunction;
 using DLG = CPO_HingeTypeDlg;
-using PART = DLG::PART;
+using PART = HINGE_PART;
 
 std::function<bool()> Shown(const DLG& dlg, PART part)
 {
@@ -32,8 +33,9 @@ T_BINDING<int> Enumeration(DLG& dlg, E T_PHGT_D::*member, void (DLG::*change)(E)
 void AddGeneral(CFormView& form, DLG& dlg)
 {
     form.Group(KeyText("IDS_QM_UI_HINGE_GENERAL"));
-    form.Text(KeyText("IDS_RPS_PO_Hinge_Name"), {[&dlg] { return dlg.Type().name; },
-                                                 [&dlg](const std::string& t) { dlg.SetName(t); }})
+    form.Text(KeyText("IDS_RPS_PO_Hinge_Name"),
+              {[&dlg] { return dlg.Type().name; },
+               [&dlg](const std::string& t) { dlg.Edited().name = t; }})
         .name = "name";
     form.Choice(KeyText("IDS_RPS_PO_Element_Type"),
                 Enumeration(dlg, &T_PHGT_D::element, &DLG::OnSelChangeElement),
@@ -64,23 +66,23 @@ void AddReferences(CFormView& form, DLG& dlg)
     form.Group(KeyText("IDS_QM_UI_HINGE_REFERENCES"));
     Set(RefChoice(form, KeyText("IDS_CMD_IEHP_SECT_TXT"),
                   {[&type] { return type.section; },
-                   [&](const int& key) { dlg.SetSection(key, type.sectionMaterial); }},
+                   [&dlg](const int& key) { dlg.Edited().section = key; }},
                   [&dlg] { return dlg.InitPropCombo_Sect(); }),
         "section", {}, Shown(dlg, PART::Section));
     Set(RefChoice(form, KeyText("IDS_QM_UI_HINGE_MATERIAL"),
                   {[&type] { return type.sectionMaterial; },
-                   [&dlg, &type](const int& key) { dlg.SetSection(type.section, key); }},
+                   [&dlg](const int& key) { dlg.Edited().sectionMaterial = key; }},
                   [&dlg] { return dlg.InitPropCombo_Matl(); }),
         "sectionMaterial", {}, Shown(dlg, PART::Section));
     Set(RefChoice(form, KeyText("IDS_CMD_IEHP_THIK_TXT"),
                   {[&type] { return type.thicknessSection; },
-                   [&dlg](const int& key) { dlg.SetThicknessSection(key); }},
+                   [&dlg](const int& key) { dlg.Edited().thicknessSection = key; }},
                   [&dlg] { return dlg.InitPropCombo_Thik(); }),
         "thicknessSection", {}, Shown(dlg, PART::Thickness));
     const auto wall = [&dlg] { return dlg.Type().element == HINGE_ELEMENT::Wall; };
     Set(RefChoice(form, KeyText("IDS_QM_UI_HINGE_FIBRES"),
                   {[&type] { return type.fibreSection; },
-                   [&dlg](const int& key) { dlg.SetFibreSection(key); }},
+                   [&dlg](const int& key) { dlg.Edited().fibreSection = key; }},
                   [&dlg, wall] {
                       return wall() ? dlg.InitFiberCombo_Fibw() : dlg.InitFiberCombo_Fibr();
                   }),
@@ -95,7 +97,7 @@ void AddReferences(CFormView& form, DLG& dlg)
 std::vector<std::string> CurveTexts(const DLG& dlg, HINGE_COMPONENT c)
 {
     std::vector<std::string> texts;
-    for (const DLG::T_SKCV_ENTRY& e : dlg.CurveTypes(c)) {
+    for (const T_SKCV_ENTRY& e : dlg.CustomizeSkcvCmb(c)) {
         const std::string why =
             e.enabled ? "" : " " + MMSGFunction::GetValue("IDS_QM_UI_HINGE_NEEDS_CODES");
         texts.push_back(MMSGFunction::GetValue(e.key) + why);
@@ -110,26 +112,26 @@ void AddComponent(CFormView& form, DLG& dlg, HINGE_COMPONENT c)
     const auto component = [&dlg, i]() -> const T_HINGE_COMPONENT& {
         return dlg.Type().components[i];
     };
-    const auto has = [&dlg, c] { return DLG::HasComponent(dlg.Type().element, c); };
+    const auto has = [&dlg, c] { return HasComponent(dlg.Type().element, c); };
     const auto active = [component] { return component().active; };
     const auto located = [active, on = Enabled(dlg, PART::Location)] { return active() && on(); };
     Set(form.Flag(PlainLabel(name), {active,
                                      [&dlg, c](const bool& on) {
                                          dlg.OnComponentCtrl(c, on);
-                                         if (on) dlg.ShowPageOf(c);
+                                         if (on) dlg.Preview().ShowFirstOf(c);
                                      }}),
         name + ".active", has);
     Set(form.Choice(PlainLabel(name),
                     {[&dlg, c] { return dlg.SelectedSkcv(c); },
                      [&dlg, c](const int& k) {
                          (void)dlg.OnSelChangeSkcv(c, k);
-                         dlg.ShowPageOf(c);
+                         dlg.Preview().ShowFirstOf(c);
                      }},
                     [&dlg, c] { return CurveTexts(dlg, c); }),
         name + ".type", active);
     Set(form.Button(KeyText("IDS_QM_UI_HINGE_EDIT_CURVE"),
                     [&dlg, c] {
-                        dlg.ShowPageOf(c);
+                        dlg.Preview().ShowFirstOf(c);
                         (void)dlg.OnBtnSkcvProp(c);
                     }),
         name + ".curve", active);
@@ -163,6 +165,14 @@ void AddComponents(CFormView& form, DLG& dlg)
     form.EndGroup();
 }
 
+std::vector<std::string> InteractionTexts()
+{
+    std::vector<std::string> texts;
+    for (const HINGE_INTERACTION i : kBendingInteractions)
+        texts.push_back(CPushOverHingeListDlg::InteractionText(static_cast<int>(i)));
+    return texts;
+}
+
 /// A button that opens the editor of a part.
 CFormField& AddPart(CFormView& form, DLG& dlg, PART part, const char* key, const char* name,
                     int (DLG::*open)())
@@ -177,7 +187,7 @@ void AddParts(CFormView& form, DLG& dlg)
     Set(form.Choice(KeyText("IDS_QM_UI_HINGE_INTERACTION"),
                     {[&dlg] { return DLG::ConvertInteraction(dlg.Type().interaction); },
                      [&dlg](const int& i) { (void)dlg.OnSelChangeInteraction(i); }},
-                    [] { return DLG::InteractionTexts(); }),
+                    InteractionTexts),
         "interaction", Enabled(dlg, PART::Interaction), Shown(dlg, PART::Interaction));
     form.Columns();
     AddPart(form, dlg, PART::YieldSurface, "IDS_QM_UI_HINGE_SURFACE_BTN", "yieldSurface",
@@ -197,7 +207,7 @@ void AddParts(CFormView& form, DLG& dlg)
     form.EndColumns();
     Set(form.Flag(KeyText("IDS_QM_UI_HINGE_WITHHOLD"),
                   {[&dlg] { return dlg.Type().withholdMzLength; },
-                   [&dlg](const bool& on) { dlg.OnWithholdMzChk(on); }}),
+                   [&dlg](const bool& on) { dlg.Edited().withholdMzLength = on; }}),
         "withholdMzLength", {}, Shown(dlg, PART::HingeLength));
     Set(form.Flag(KeyText("IDS_QM_UI_HINGE_MASONRY_ON"),
                   {[&dlg] { return dlg.Type().masonry.has_value(); },
@@ -213,10 +223,11 @@ void AddParts(CFormView& form, DLG& dlg)
 void AddPreview(CFormView& form, DLG& dlg)
 {
     form.Choice(KeyText("IDS_QM_UI_HINGE_PREVIEW"),
-                {[&dlg] { return dlg.Page(); }, [&dlg](const int& i) { dlg.ShowPage(i); }},
+                {[&dlg] { return dlg.Preview().Shown(); },
+                 [&dlg](const int& i) { dlg.Preview().Show(i); }},
                 [&dlg] {
                     std::vector<std::string> texts;
-                    for (const DLG::T_PAGE& page : dlg.Pages())
+                    for (const CHingePages::T_PAGE& page : dlg.Preview().All())
                         texts.push_back(page.text);
                     return texts;
                 })
@@ -224,9 +235,10 @@ void AddPreview(CFormView& form, DLG& dlg)
     form.Picture([&dlg] {
         T_PLOT none;
         none.notes.push_back(MMSGFunction::GetValue("IDS_QM_UI_HINGE_NO_COMPONENT"));
-        const T_SKEL_CURVE* curve = dlg.PageCurve();
+        const T_SKEL_CURVE* curve = dlg.Preview().Curve();
         if (!curve) return none;
-        const DLG::T_PAGE page = dlg.Pages()[static_cast<std::size_t>(dlg.Page())];
+        const CHingePages& pages = dlg.Preview();
+        const CHingePages::T_PAGE page = pages.All()[static_cast<std::size_t>(pages.Shown())];
         return HingeBackbonePlot(dlg.Type(), page.component, *curve, page.text);
     });
 }

@@ -10,7 +10,7 @@
 
 /// Base of the grids of interaction points. The numbers stay in the record of the dialog, which
 /// must outlive the grid.
-class CHingeNumberGrid : public zql::frx::MDialog {
+class CNumberGrid : public zql::frx::MDialog {
 public:
     virtual std::size_t Rows() const = 0;
     virtual std::size_t Columns() const = 0;

@@ -1,4 +1,4 @@
-#include "qm_rps/hinge/hingedocument.h"
+#include "qm_rps/hingedocument.h"
 
 #include "qm_rps/hinge/hingegenerator.h"
 

@@ -1,4 +1,6 @@
-#include "qm_rps/desk/recordtable.h"
+#include "qm_rps/dialog/unithead.h"
+
+#include "qm_base/msgfunction.h"
 
 std::string HeadWithUnit(const std::string& head, const std::optional<T_DIM>& dim,
                          const T_UNITS& units)

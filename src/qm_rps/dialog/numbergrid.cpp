@@ -1,4 +1,4 @@
-#include "qm_rps/dialog/hingenumbergrid.h"
+#include "qm_rps/dialog/numbergrid.h"
 
 #include "qm_base/textformat.h"
 
@@ -17,14 +17,14 @@ std::string_view Trim(std::string_view text)
 
 } // namespace
 
-std::string CHingeNumberGrid::CellText(std::size_t row, std::size_t column) const
+std::string CNumberGrid::CellText(std::size_t row, std::size_t column) const
 {
     if (row >= Rows() || column >= Columns()) return {};
     return Format(*CellOf(row, column) * ScaleOf(row, column));
 }
 
-bool CHingeNumberGrid::Read(const std::string& text, std::size_t row, std::size_t column,
-                            double& value) const
+bool CNumberGrid::Read(const std::string& text, std::size_t row, std::size_t column,
+                       double& value) const
 {
     const std::optional<double> number = ParseFinite(Trim(text));
     const double scale = ScaleOf(row, column);
@@ -33,7 +33,7 @@ bool CHingeNumberGrid::Read(const std::string& text, std::size_t row, std::size_
     return std::isfinite(value);
 }
 
-int CHingeNumberGrid::SetCellText(std::size_t row, std::size_t column, const std::string& text)
+int CNumberGrid::SetCellText(std::size_t row, std::size_t column, const std::string& text)
 {
     double value = 0.0;
     if (row >= Rows() || column >= Columns() || !Read(text, row, column, value)) return 0;
@@ -41,7 +41,7 @@ int CHingeNumberGrid::SetCellText(std::size_t row, std::size_t column, const std
     return 1;
 }
 
-int CHingeNumberGrid::Paste(const std::string& text, const T_GRID_RANGE& range)
+int CNumberGrid::Paste(const std::string& text, const T_GRID_RANGE& range)
 {
     const T_GRID_BLOCK block = BlockOfText(text);
     if (const char* key = WrongShape(block, range, Rows(), Columns())) {

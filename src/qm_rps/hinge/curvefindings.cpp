@@ -1,0 +1,169 @@
+#include "qm_rps/hinge/curvefindings.h"
+
+#include "qm_base/msgfunction.h"
+#include "qm_base/textformat.h"
+#include "qm_rps/hinge/backbonerules.h"
+
+#include <algorithm>
+
+namespace {
+
+using T_FINDINGS = std::vector<T_FINDING>;
+using F = T_SKEL_FEMA;
+
+bool InUnit(double v)
+{
+    return NotAbove(0, v) && NotAbove(v, 1);
+}
+
+constexpr T_HINGE_RULE<double> kDcRatio[] = {
+    {{.message = "IDS_RPS_Error_Pushove_Hinge_Properties_DC_RATIO", .field = "dcRatio.pos"},
+     [](const double& ratio) { return InUnit(ratio); }},
+};
+
+constexpr T_HINGE_HEAD StiffnessHead(const char* bound)
+{
+    return {.key = {"IDS_RPS_PO_PHGT_Initial_Stiffness"},
+            .suffix = bound,
+            .field = "sides.pos.userStiffness"};
+}
+constexpr T_HINGE_RULE<double> kFemaStiffness[] = {
+    {StiffnessHead(" >= 0"), [](const double& k) { return NotAbove(0, k); }},
+};
+constexpr T_HINGE_RULE<double> kEc8Stiffness[] = {
+    {StiffnessHead(" > 0"), [](const double& k) { return Below(0, k); }},
+};
+
+constexpr T_HINGE_RULE<F> kUnloading[] = {
+    {{.key = {"IDS_RPS_PO_PHGT_UNLOADING_EXP"}, .field = "unloadExponent"},
+     [](const F& f) { return NotAbove(0, f.unloadExponent); }},
+    {{.key = {"IDS_RPS_PO_PHGT_UNLOADING_PRF"}, .field = "unloadProportion"},
+     [](const F& f) { return InUnit(f.unloadProportion); }},
+};
+constexpr T_HINGE_RULE<F> kUnloadFactor[] = {
+    {{.text = "-1.0 <= Unloading Stiffness Factor <= 1.0", .field = "unloadFactor"},
+     [](const F& f) { return NotAbove(-1, f.unloadFactor) && NotAbove(f.unloadFactor, 1); }},
+};
+
+/// A rule of one number of each side.
+void WalkSides(const T_HINGE_RULE<double> (&rules)[1], double pos, std::optional<double> neg,
+               const T_HINGE_PLACE& place, T_FINDINGS& out)
+{
+    WalkRules(rules, pos, place.On(HINGE_SIDE::Positive), out);
+    if (neg) WalkRules(rules, *neg, place.On(HINGE_SIDE::Negative), out);
+}
+
+template <class CURVE>
+void CheckStiffness(const CURVE& curve, const T_SIDES<T_SKEL_SIDE>& sides, bool two,
+                    const T_HINGE_RULE<double> (&rules)[1], const T_HINGE_PLACE& place,
+                    T_FINDINGS& out)
+{
+    if (curve.initStiffness != INIT_STIFFNESS::User) return;
+    const auto neg = two ? std::optional(sides.neg.userStiffness) : std::nullopt;
+    WalkSides(rules, sides.pos.userStiffness, neg, place, out);
+}
+
+/// The list of curves by axial force: at least two, no force twice.
+void CheckList(const F& f, const T_HINGE_PLACE& place, T_FINDINGS& out)
+{
+    if (f.curves.size() < 2)
+        out.push_back(FindingOf(
+            T_HINGE_HEAD{.message = "IDS_RPS_MULTI_CURVE_COUNT", .field = "curves"}, place));
+    for (std::size_t i = 0; i < f.curves.size(); ++i) {
+        const auto same = [&](const T_SKEL_AXIAL& a) { return a.axial == f.curves[i].axial; };
+        const auto end = f.curves.begin() + static_cast<std::ptrdiff_t>(i);
+        if (std::find_if(f.curves.begin(), end, same) == end) continue;
+        const std::string rule = FormatText("Axial Force %g already exists!", f.curves[i].axial);
+        out.push_back(FindingOf(T_HINGE_HEAD{.text = rule.c_str(), .field = "axial"},
+                                {place.component, place.end, static_cast<int>(i)}));
+    }
+}
+
+/// Calls check(sides, place) for the curve's own sides, or for those of each axial force.
+template <class CHECK>
+void ForEachForce(const F& f, const T_HINGE_PLACE& place, CHECK check)
+{
+    if (!f.multiCurve) return check(f.sides, place);
+    for (std::size_t i = 0; i < f.curves.size(); ++i)
+        check(f.curves[i].sides, {place.component, place.end, static_cast<int>(i)});
+}
+
+/// Findings of a group under the message of a table.
+void CheckUnder(const char* key, BACKBONE_CHECK check, const T_BACKBONE& b,
+                const T_HINGE_PLACE& place, T_FINDINGS& out)
+{
+    const std::size_t first = out.size();
+    check(b, place, out);
+    for (std::size_t i = first; i < out.size(); ++i) {
+        out[i].messageKey = key;
+        out[i].text = zql::lib::MMSGFunction::GetValue(key);
+    }
+}
+
+} // namespace
+
+void CurveFindings(const T_SKEL_FEMA& curve, const T_HINGE_PLACE& place, T_FINDINGS& out)
+{
+    using T_SIDES_OF_CURVE = T_SIDES<T_SKEL_SIDE>;
+    const auto group = [&](BACKBONE_CHECK check) {
+        ForEachForce(curve, place, [&](const T_SIDES_OF_CURVE& sides, const T_HINGE_PLACE& at) {
+            check(CheckedSides(curve, sides), at, out);
+        });
+    };
+    if (curve.multiCurve) CheckList(curve, place, out);
+    group(CheckPositiveSigns);
+    group(CheckNegativeSigns);
+    group(CheckFemaOrder);
+    group(CheckAcceptance);
+    if (curve.dcRatio) WalkSides(kDcRatio, curve.dcRatio->pos, curve.dcRatio->neg, place, out);
+    group(CheckYieldStrengths);
+    ForEachForce(curve, place, [&](const T_SIDES_OF_CURVE& sides, const T_HINGE_PLACE& at) {
+        CheckStiffness(curve, sides, curve.asymStiffness, kFemaStiffness, at, out);
+    });
+    WalkRules(kUnloading, curve, place, out);
+    if (!curve.energyBased) return;
+    group(CheckEnergyFactors);
+    WalkRules(kUnloadFactor, curve, place, out);
+}
+
+void CurveFindings(const T_SKEL_EC8& curve, const T_HINGE_PLACE& place, T_FINDINGS& out)
+{
+    const T_BACKBONE b = CheckedSides(curve, curve.sides);
+    for (BACKBONE_CHECK* check : {CheckPositiveSigns, CheckNegativeSigns, CheckEc8Order,
+                                  CheckAcceptance, CheckYieldStrengths})
+        check(b, place, out);
+    CheckStiffness(curve, curve.sides, !curve.symmetric, kEc8Stiffness, place, out);
+}
+
+void CurveFindings(const T_SKEL_CURVE& curve, SKEL_TYPE type, const T_HINGE_PLACE& place,
+                   T_FINDINGS& out)
+{
+    if (const auto* m = std::get_if<T_SKEL_MULTI>(&curve))
+        CurveFindings(*m, type, place, out);
+    else if (const auto* f = std::get_if<T_SKEL_FEMA>(&curve))
+        CurveFindings(*f, place, out);
+    else
+        CurveFindings(std::get<T_SKEL_EC8>(curve), place, out);
+}
+
+std::vector<T_FINDING> ComponentFindings(HINGE_COMPONENT c, const T_HINGE_COMPONENT& component)
+{
+    T_FINDINGS out;
+    if (!component.active) return out;
+    ForEachPage(component, [&](HINGE_END end, const T_SKEL_CURVE& curve) {
+        CurveFindings(curve, component.type, {static_cast<int>(c), end}, out);
+    });
+    return out;
+}
+
+std::vector<T_FINDING> DiagramFindings(const T_SKEL_FEMA& curve, HINGE_COMPONENT c)
+{
+    const T_BACKBONE b = CheckedSides(curve, curve.sides);
+    const T_HINGE_PLACE place{static_cast<int>(c)};
+    T_FINDINGS out;
+    for (BACKBONE_CHECK* check :
+         {CheckPositiveSigns, CheckNegativeSigns, CheckFromOrigin, CheckFemaOrder})
+        CheckUnder("IDS_PUSHOVER_Wrong_Data_in_the_Hinge_Diagram_Table_", *check, b, place, out);
+    CheckUnder("IDS_PUSHOVER_Wrong_Data_in_Acceptance_Criteria_", CheckAcceptance, b, place, out);
+    return out;
+}

@@ -1,0 +1,216 @@
+#include "qm_rps/hinge/hingechoices.h"
+
+#include "qm_rps/hinge/hingetheta.h"
+
+#include <algorithm>
+
+namespace {
+
+using ENTRY = T_SKCV_ENTRY;
+constexpr ENTRY kBilinear{"IDS_RPS_PO_PHGT_SKCV_Bilinear_Type", SKEL_TYPE::Bilinear};
+constexpr ENTRY kTrilinear{"IDS_RPS_PO_PHGT_SKCV_Trilinear_Type", SKEL_TYPE::Trilinear};
+constexpr ENTRY kSlipBi{"IDS_RPS_PO_PHGT_SKCV_Slip_Bilinear_Type", SKEL_TYPE::SlipBilinear};
+constexpr ENTRY kSlipTri{"IDS_RPS_PO_PHGT_SKCV_Slip_Trilinear_Type", SKEL_TYPE::SlipTrilinear};
+constexpr ENTRY kCompression{"IDS_RPS_PO_PHGT_SKCV_Compression_Only_Type",
+                             SKEL_TYPE::CompressionOnly};
+constexpr ENTRY kFema{"IDS_RPS_PO_PHGT_SKCV_FEMA", SKEL_TYPE::Fema};
+constexpr ENTRY kDegrading{"IDS_RPS_PO_PHGT_SKCV_STRENGTH_DEG_TYPE", SKEL_TYPE::Fema};
+constexpr ENTRY kGsd{"IDS_RPS_PO_PHGT_SKCV_GSD_TYPE", SKEL_TYPE::Fema};
+constexpr const char* kEc8Key = "IDS_RPS_PO_PHGT_SKCV_EC8";
+
+/// The entry under which code 4 is listed, or null.
+const ENTRY* FemaEntry(const T_PHGT_D& t, HINGE_COMPONENT c, const T_HINGE_CONTEXT& x)
+{
+    if (!x.altHysteresis) return &kFema;
+    if (t.element == HINGE_ELEMENT::Wall && x.strengthDegradation) return &kDegrading;
+    return IsBending(c) && x.gsd && x.gsdAllowed ? &kGsd : nullptr;
+}
+
+using T = T_PHGT_D;
+using C = HINGE_COMPONENT;
+
+bool IsFrame(const T& t)
+{
+    return t.element == HINGE_ELEMENT::BeamColumn;
+}
+bool IsWall(const T& t)
+{
+    return t.element == HINGE_ELEMENT::Wall;
+}
+bool IsTruss(const T& t)
+{
+    return t.element == HINGE_ELEMENT::Truss;
+}
+bool Bends(const T& t)
+{
+    return IsFrame(t) || IsWall(t);
+}
+bool IsLine(const T& t)
+{
+    return Bends(t) || IsTruss(t);
+}
+bool BySection(const T& t)
+{
+    return t.definition != HINGE_DEFINITION::MomentRotation;
+}
+bool BendingActive(const T& t)
+{
+    return At(t, C::My).active || At(t, C::Mz).active;
+}
+template <HINGE_INTERACTION I>
+bool Interacts(const T& t)
+{
+    return BendingActive(t) && t.interaction == I;
+}
+bool HasFrameFibres(const T& t)
+{
+    return (IsFrame(t) || IsTruss(t)) && BySection(t);
+}
+bool HasWallFibres(const T& t)
+{
+    return IsWall(t) && BySection(t);
+}
+bool IsDistributed(const T& t)
+{
+    return Bends(t) && t.definition == HINGE_DEFINITION::CurvatureDistributed;
+}
+bool IsMasonry(const T& t)
+{
+    return Bends(t) && t.material == MATL_CLASS::Masonry;
+}
+bool HasFemaAxial(const T& t)
+{
+    return At(t, C::Fx).active && At(t, C::Fx).type == SKEL_TYPE::Fema;
+}
+
+/// Disabled where it is not shown.
+struct T_PART_ROW {
+    HINGE_PART part;
+    bool (*shown)(const T&);
+    bool (*enabled)(const T&) = nullptr; // null: always
+};
+using P = HINGE_PART;
+constexpr T_PART_ROW kParts[] = {
+    {P::Interaction, Bends, BendingActive},
+    {P::YieldSurface, Bends, Interacts<HINGE_INTERACTION::PMM>},
+    {P::UserInteraction, Bends, Interacts<HINGE_INTERACTION::User>},
+    {P::Section, IsLine},
+    {P::Thickness, IsWall},
+    {P::FibreFrame, HasFrameFibres},
+    {P::FibreWall, HasWallFibres},
+    {P::IntegrationPoints, IsDistributed},
+    {P::HingeLength, Bends}, // enabled by the components
+    {P::Location, Bends},
+    {P::Masonry, IsMasonry},
+    {P::InfillStrut, IsTruss, HasFemaAxial},
+};
+
+template <class CURVE>
+T_SIDES<std::optional<double>> StiffnessOf(const CURVE& curve, HINGE_COMPONENT c, HINGE_END end,
+                                           const T_THETA_LOOKUP& lookup)
+{
+    const auto at = end == HINGE_END::J ? HINGE_LOCATION::JEnd : HINGE_LOCATION::IEnd;
+    const auto stiffness = [&](const auto& side) {
+        return CHingeTheta::CalcStiffness(lookup, c, at, curve.initStiffness, side.userStiffness);
+    };
+    bool two = !curve.symmetric;
+    if constexpr (requires { curve.asymStiffness; }) two = curve.asymStiffness;
+    return {stiffness(curve.sides.pos), stiffness(two ? curve.sides.neg : curve.sides.pos)};
+}
+
+} // namespace
+
+std::vector<T_SKCV_ENTRY> OfferedCurves(const T_PHGT_D& type, HINGE_COMPONENT c,
+                                        const T_HINGE_CONTEXT& context)
+{
+    if (type.element == HINGE_ELEMENT::PointSpring) return {kCompression, kBilinear, kTrilinear};
+    if (type.definition == HINGE_DEFINITION::CurvatureDistributed) return {kFema};
+    std::vector<ENTRY> list{kBilinear, kTrilinear};
+    if (const ENTRY* fema = FemaEntry(type, c, context)) list.push_back(*fema);
+    list.push_back(kSlipBi);
+    list.push_back(kSlipTri);
+    if (!context.altHysteresis && c != HINGE_COMPONENT::Mx &&
+        type.element != HINGE_ELEMENT::GeneralLink)
+        list.push_back(
+            {kEc8Key, SKEL_TYPE::Ec8, IsEurocodePair(context.concreteCode, context.steelCode)});
+    return list;
+}
+
+const char* CurveKey(SKEL_TYPE code)
+{
+    static constexpr const char* keys[] = {kBilinear.key,   kTrilinear.key, kSlipBi.key,
+                                           kSlipTri.key,    kFema.key,      kEc8Key,
+                                           kCompression.key};
+    const auto at = static_cast<std::size_t>(code);
+    return at < std::size(keys) ? keys[at] : "IDS_PUSHOVER_Error";
+}
+
+bool IsEurocodePair(const std::string& concreteCode, const std::string& steelCode)
+{
+    return (concreteCode == "Eurocode2" || concreteCode == "Eurocode2:04") &&
+           (steelCode == "Eurocode3" || steelCode == "Eurocode3:05");
+}
+
+bool HasComponent(HINGE_ELEMENT element, HINGE_COMPONENT c)
+{
+    return element != HINGE_ELEMENT::Truss || c == HINGE_COMPONENT::Fx;
+}
+
+SKEL_TYPE YieldSurfaceCurve(const T_PHGT_D& type)
+{
+    const T_HINGE_COMPONENT& my = At(type, C::My);
+    return my.active ? my.type : At(type, C::Mz).type;
+}
+
+T_LENGTH_NEEDS LengthNeeds(const T_PHGT_D& type, bool altHysteresis)
+{
+    T_LENGTH_NEEDS needs{};
+    for (std::size_t i = 0; i < needs.size(); ++i) {
+        const T_HINGE_COMPONENT& c = type.components[i];
+        const auto which = static_cast<HINGE_COMPONENT>(i);
+        const bool bending = IsBending(which) && !(which == C::Mz && type.withholdMzLength);
+        const bool any = c.active && (altHysteresis || (bending && c.type == SKEL_TYPE::Ec8));
+        const bool both = c.location == HINGE_LOCATION::BothEnds;
+        needs[i].I = any && (both || c.location == HINGE_LOCATION::IEnd);
+        needs[i].J = any && (both || c.location == HINGE_LOCATION::JEnd);
+    }
+    return needs;
+}
+
+T_PART_STATES PartStates(const T_PHGT_D& type, bool altHysteresis)
+{
+    T_PART_STATES states{};
+    for (const T_PART_ROW& row : kParts) {
+        T_PART_STATE& state = states[static_cast<std::size_t>(row.part)];
+        state.shown = row.shown(type);
+        state.enabled = state.shown && (!row.enabled || row.enabled(type));
+    }
+    T_PART_STATE& length = states[static_cast<std::size_t>(P::HingeLength)];
+    length.enabled = length.shown && std::ranges::any_of(LengthNeeds(type, altHysteresis),
+                                                         [](auto e) { return e.I || e.J; });
+    return states;
+}
+
+std::vector<T_STIFFNESS_ROW> StiffnessRows(const T_PHGT_D& type, const T_HINGE_CONTEXT& context,
+                                           double memberLength)
+{
+    T_THETA_LOOKUP lookup;
+    lookup.memberLength = type.length.autoSpan ? memberLength : type.length.span;
+    if (context.sources) {
+        lookup.section = context.sources->Section(type.section);
+        lookup.material = context.sources->Material(type.sectionMaterial);
+    }
+    std::vector<T_STIFFNESS_ROW> rows;
+    for (std::size_t i = 0; i < type.components.size(); ++i) {
+        if (!type.components[i].active) continue;
+        const auto c = static_cast<HINGE_COMPONENT>(i);
+        ForEachPage(type.components[i], [&](HINGE_END end, const T_SKEL_CURVE& curve) {
+            std::visit(
+                [&](const auto& k) {
+                    rows.push_back({c, end, k.initStiffness, StiffnessOf(k, c, end, lookup)});
+                },
+                curve);
+        });
+    }
+    return rows;
+}
