@@ -2,6 +2,7 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+#include "qm_db/editscope.h"
 #include "qm_rps/factors/ulfcombinationchecks.h"
 
 #include <algorithm>
@@ -111,15 +112,13 @@ std::vector<T_FINDING> CLoadCombinationDlg::Findings() const
 int CLoadCombinationDlg::OnOK()
 {
     if (!CheckData()) return 0;
-    const auto& table = m_doc.Data().Model().combinations;
-    const int key = m_key ? m_key : table.empty() ? 1 : table.rbegin()->first + 1;
-    CEditData& edit = m_doc.Edit();
-    if (!edit.Begin(m_combination.name)) return 0;
+    const int key = m_key ? m_key : NextKey(m_doc.Data().Model().combinations);
+    CEditScope edit(m_doc, m_combination.name);
+    if (!edit.IsOpen()) return 0;
     if (edit.Put(key, m_combination) && edit.Commit()) {
         m_key = key;
         return 1;
     }
-    edit.Rollback();
     // What the check could not see: another combination contains this one.
     constexpr const char* kCycle = "IDS_QM_DB_LCOM_CYCLE";
     ShowMessage(kCycle, MMSGFunction::Format(kCycle, {m_combination.name}));

@@ -1,6 +1,7 @@
 #include "qm_rps/unknownloadfactorconstraintdlg.h"
 
 #include "qm_base/msgfunction.h"
+#include "qm_db/editscope.h"
 #include "qm_rps/factors/ulfconstraintchecks.h"
 #include "qm_rps/factors/ulfstageplace.h"
 #include "qm_rps/factors/ulftexts.h"
@@ -12,25 +13,24 @@ namespace {
 
 /// Items of a kind that name the constraint take the new name over.
 template <class T>
-int RenameIn(CDBDoc& doc, const T_TABLE<T>& table, const std::string& before,
+int RenameIn(CEditScope& edit, T_TABLE<T> items, const std::string& before,
              const std::string& after)
 {
-    const T_TABLE<T> items = table; // the edit changes the table
-    for (const auto& [key, item] : items) {
-        T changed = item;
-        const auto it = std::ranges::find(changed.constraints, before);
-        if (it == changed.constraints.end()) continue;
+    for (auto& [key, item] : items) {
+        const auto it = std::ranges::find(item.constraints, before);
+        if (it == item.constraints.end()) continue;
         *it = after;
-        if (!doc.Edit().Put(key, changed)) return 0;
+        if (!edit.Put(key, item)) return 0;
     }
     return 1;
 }
 
-int RenameInItems(CDBDoc& doc, const std::string& before, const std::string& after)
+int RenameInItems(CDBDoc& doc, CEditScope& edit, const std::string& before,
+                  const std::string& after)
 {
     const T_MODEL& model = doc.Data().Model();
-    return RenameIn(doc, model.ulfItems, before, after) &&
-           RenameIn(doc, model.ulfStageItems, before, after);
+    return RenameIn(edit, model.ulfItems, before, after) &&
+           RenameIn(edit, model.ulfStageItems, before, after);
 }
 
 } // namespace
@@ -134,14 +134,10 @@ int CUnknownLoadFactorConstraintDlg::OnOK()
     const T_TABLE<T_ULFC_D>& table = m_doc.Data().Model().ulfConstraints;
     const auto own = table.find(m_key);
     const std::string before = own == table.end() ? c.name : own->second.name;
-    const int key = m_key ? m_key : table.empty() ? 1 : table.rbegin()->first + 1;
-    CEditData& edit = m_doc.Edit();
-    if (!edit.Begin(c.name)) return 0;
-    const bool renamed = before == c.name || RenameInItems(m_doc, before, c.name);
-    if (!renamed || !edit.Put(key, c) || !edit.Commit()) {
-        edit.Rollback();
-        return 0;
-    }
+    const int key = m_key ? m_key : NextKey(table);
+    CEditScope edit(m_doc, c.name);
+    const bool renamed = before == c.name || RenameInItems(m_doc, edit, before, c.name);
+    if (!renamed || !edit.Put(key, c) || !edit.Commit()) return 0;
     m_key = key;
     return 1;
 }

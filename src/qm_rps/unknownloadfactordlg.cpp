@@ -1,5 +1,6 @@
 #include "qm_rps/unknownloadfactordlg.h"
 
+#include "qm_rps/factors/ulfstore.h"
 #include "qm_rps/unknownloadfactoritemdlg.h"
 #include "qm_rps/unknownstageitemdlg.h"
 
@@ -73,22 +74,9 @@ int CUnknownLoadFactorDlg::OnModify()
                    : Show(CUnknownLoadFactorItemDlg(m_doc, m_selected), false);
 }
 
-template <class T>
-int CUnknownLoadFactorDlg::Delete(const T_TABLE<T>& table)
-{
-    CEditData& edit = m_doc.Edit();
-    if (!edit.Begin(table.at(m_selected).name)) return 0;
-    if (!edit.Erase<T>(m_selected) || !edit.Commit()) {
-        edit.Rollback();
-        return 0;
-    }
-    m_selected = 0;
-    return 1;
-}
-
 int CUnknownLoadFactorDlg::OnDelete()
 {
     if (!CheckData()) return 0;
-    const T_MODEL& model = m_doc.Data().Model();
-    return m_stage ? Delete(model.ulfStageItems) : Delete(model.ulfItems);
+    return m_stage ? DeleteRecord<T_ULSI_D>(m_doc, m_selected)
+                   : DeleteRecord<T_ULFI_D>(m_doc, m_selected);
 }

@@ -42,8 +42,6 @@ public:
 private:
     template <class DIALOG>
     [[nodiscard]] int Show(DIALOG&& dialog, bool stage);
-    template <class T>
-    [[nodiscard]] int Delete(const T_TABLE<T>& table);
 
     CDBDoc& m_doc;
 };

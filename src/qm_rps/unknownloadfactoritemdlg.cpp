@@ -3,6 +3,7 @@
 #include "qm_base/textformat.h"
 #include "qm_rps/factors/ulfcombination.h"
 #include "qm_rps/factors/ulfitemchecks.h"
+#include "qm_rps/factors/ulfstore.h"
 #include "qm_rps/ulfcalculation.h"
 
 #include <algorithm>
@@ -113,17 +114,7 @@ std::vector<T_FINDING> CUnknownLoadFactorItemDlg::Findings() const
 int CUnknownLoadFactorItemDlg::OnOK()
 {
     T_ULFI_D item;
-    if (!Dlg2Data(item)) return 0;
-    const T_TABLE<T_ULFI_D>& table = m_doc.Data().Model().ulfItems;
-    const int key = m_key ? m_key : table.empty() ? 1 : table.rbegin()->first + 1;
-    CEditData& edit = m_doc.Edit();
-    if (!edit.Begin(item.name)) return 0;
-    if (!edit.Put(key, item) || !edit.Commit()) {
-        edit.Rollback();
-        return 0;
-    }
-    m_key = key;
-    return 1;
+    return Dlg2Data(item) ? StoreRecord(m_doc, m_key, item) : 0;
 }
 
 std::optional<T_ANALYSIS_OPTIONS> CUnknownLoadFactorItemDlg::MissingResults() const

@@ -5,6 +5,7 @@
 #include "qm_rps/factors/ulfitemchecks.h"
 #include "qm_rps/factors/ulfstageplace.h"
 #include "qm_rps/factors/ulfstageresults.h"
+#include "qm_rps/factors/ulfstore.h"
 #include "qm_rps/ulfcalculation.h"
 #include "qm_rps/ulfiterationrundlg.h"
 
@@ -164,17 +165,7 @@ std::vector<T_FINDING> CUnknownStageItemDlg::Findings() const
 int CUnknownStageItemDlg::OnOK()
 {
     T_ULSI_D item;
-    if (!Dlg2Data(item)) return 0;
-    const T_TABLE<T_ULSI_D>& table = m_doc.Data().Model().ulfStageItems;
-    const int key = m_key ? m_key : table.empty() ? 1 : table.rbegin()->first + 1;
-    CEditData& edit = m_doc.Edit();
-    if (!edit.Begin(item.name)) return 0;
-    if (!edit.Put(key, item) || !edit.Commit()) {
-        edit.Rollback();
-        return 0;
-    }
-    m_key = key;
-    return 1;
+    return Dlg2Data(item) ? StoreRecord(m_doc, m_key, item) : 0;
 }
 
 std::array<CUnknownStageItemDlg::T_SUMMARY, 3> CUnknownStageItemDlg::Summary() const

@@ -2,6 +2,7 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_rps/factors/ulfstageplace.h"
+#include "qm_rps/factors/ulfstore.h"
 #include "qm_rps/unknownloadfactorconstraintdlg.h"
 
 #include <algorithm>
@@ -71,12 +72,5 @@ int CUnknownTableTabGrid1::OnDelete()
         ShowMessage(used, MMSGFunction::Format(used, {name, users}));
         return 0;
     }
-    CEditData& edit = m_doc.Edit();
-    if (!edit.Begin(name)) return 0;
-    if (!edit.Erase<T_ULFC_D>(m_selected) || !edit.Commit()) {
-        edit.Rollback();
-        return 0;
-    }
-    m_selected = 0;
-    return 1;
+    return DeleteRecord<T_ULFC_D>(m_doc, m_selected);
 }

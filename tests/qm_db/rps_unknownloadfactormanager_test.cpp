@@ -1,14 +1,12 @@
 // Problems with answers known by hand or from publications, and input that is refused.
+#include "numbers.h"
+
 #include "qm_db/rps_unknownloadfactormanager.h"
 
 #include <cmath>
 #include <gtest/gtest.h>
-#include <limits>
 
 namespace {
-
-constexpr double kNan = std::numeric_limits<double>::quiet_NaN();
-constexpr double kInf = std::numeric_limits<double>::infinity();
 
 using T_VECTOR = std::vector<double>;
 
@@ -20,51 +18,54 @@ struct T_CASE {
     T_VECTOR x; // empty: none
 };
 
+/// Two unknowns share 2 by the squares of weights 1 and 1e-3, for which 0 stands.
+const T_VECTOR kAlmostFree{2e-6 / 1.000001, 2 / 1.000001};
+
 // clang-format off
 const T_CASE kByHand[] = {
-    // label                     neq  rows               rhs       weights  obj sign err x
-    { "square shares",            1, {1, 1},            {2},      {1, 1},   2,  0,  0, {1, 1} },
-    { "square by weight",         1, {1, 1},            {2},      {1, 2},   2,  0,  0, {1.6, 0.4} },
-    { "sum takes the cheap one",  1, {1, 1},            {2},      {1, 2},   1,  0,  0, {2, 0} },
-    { "sum, tie: shortest",       1, {1, 1},            {2},      {1, 1},   1,  0,  0, {1, 1} },
-    { "sum, negative side",       1, {1, -1},           {-2},     {2, 1},   1,  0,  0, {0, 2} },
-    { "largest levels out",       1, {1, 1},            {2},      {1, 2},   3,  0,  0, {4.0 / 3, 2.0 / 3} },
-    { "largest, tie: shortest",   1, {1, 0},            {1},      {1, 1},   3,  0,  0, {1, 0} },
-    { "inequality pulls",         1, {1, 1, -1, 0},     {1, -3},  {1, 1},   2,  0,  0, {3, -2} },
-    { "sum over an inequality",   0, {-1, -2},          {-4},     {1, 1},   1,  0,  0, {0, 2} },
-    { "all negative",             1, {1, 1},            {-2},     {1, 1},   2, -1,  0, {-1, -1} },
-    { "sum, all negative",        1, {1, 3},            {-6},     {1, 1},   1, -1,  0, {0, -2} },
-    { "sign decides",             1, {1, -1, -1, 0},    {1, -1},  {1, 1},   2,  1,  0, {1, 0} },
-    { "loose bound of 1e30",      1, {1, 0, 1, 1},      {3, 1e30},{1, 1},   2,  0,  0, {3, 0} },
-    { "rows that say nothing",    1, {0, 0, 0, 0},      {0, 1},   {1, 1},   2,  0,  0, {0, 0} },
-    { "repeated equality",        2, {1, 1, 2, 2},      {2, 4},   {1, 1},   3,  1,  0, {1, 1} },
-    { "equality by inequalities", 0, {1, 1, -1, -1},    {2, -2},  {1, 1},   1,  0,  0, {1, 1} },
-    { "free unknown, square",     1, {1, 1},            {2},      {1, 0},   2,  0,  0, {2e-6 / 1.000001, 2 / 1.000001} }, // weight 1e-3
-    { "free unknown, sum",        1, {1, 1},            {2},      {1, 0},   1,  0,  0, {0, 2} },
-    { "free unknown, largest",    1, {1, 1},            {2},      {1, 0},   3,  0,  0, {0, 2} },
-    { "all unknowns free",        1, {1, 1},            {2},      {0, 0},   1,  0,  0, {1, 1} },
-    { "no rows",                  0, {},                {},       {1, 1},   1,  0,  0, {0, 0} },
-    { "overflowing unit mix",     1, {1e200, 1e-200},   {1e200},  {1e-150, 1e150}, 2, 0, 0, {1, 0} },
-    { "equalities contradict",    2, {1, 1, 1, 1},      {1, 2},   {1, 1},   2,  0,  5, {} },
-    { "zero row, not zero",       1, {0, 0},            {1},      {1, 1},   3,  0,  5, {} },
-    { "zero row, below zero",     0, {0, 0},            {-1},     {1, 1},   1,  0,  6, {} },
-    { "bounds cross",             0, {1, 0, -1, 0},     {1, -2},  {1, 1},   1,  0,  6, {} },
-    { "equality against bound",   1, {1, 1, 1, 1},      {2, 1},   {1, 1},   3,  0,  6, {} },
-    { "other sign only",          1, {1, 1},            {-2},     {1, 1},   2,  1,  7, {} },
-    { "other sign only, sum",     1, {1, 1},            {2},      {1, 1},   1, -1,  7, {} },
-    { "met within 1e-9",          2, {1, 1, 1, 1},      {1, 1 + 2e-9}, {1, 1}, 2, 0, 9, {0.5, 0.5} },
-    { "objective 0",              1, {1, 1},            {2},      {1, 1},   0,  0, -1, {} },
-    { "objective 4",              1, {1, 1},            {2},      {1, 1},   4,  0, -1, {} },
-    { "NaN in a row",             1, {1, kNan},         {2},      {1, 1},   2,  0,  4, {} },
-    { "NaN before the objective", 1, {1, kNan},         {2},      {1, 1},   9,  0,  4, {} },
-    { "infinite right-hand side", 0, {1, 1},            {kInf},   {1, 1},   2,  0,  4, {} },
-    { "NaN weight",               1, {1, 1},            {2},      {1, kNan},2,  0,  4, {} },
-    { "negative weight",          1, {1, 1},            {2},      {1, -1},  2,  0,  4, {} },
-    { "sign 2",                   1, {1, 1},            {2},      {1, 1},   2,  2,  4, {} },
-    { "more equalities than rows",2, {1, 1},            {2},      {1, 1},   2,  0,  4, {} },
-    { "negative count",          -1, {1, 1},            {2},      {1, 1},   2,  0,  4, {} },
-    { "matrix too short",         1, {1},               {2},      {1, 1},   2,  0,  4, {} },
-    { "no unknowns",              0, {},                {},       {},       2,  0,  4, {} },
+    // label                  neq rows         rhs     weights obj sign err x
+    {"square shares",         1, {1, 1},       {2},    {1, 1}, 2, 0, 0, {1, 1}},
+    {"square by weight",      1, {1, 1},       {2},    {1, 2}, 2, 0, 0, {1.6, 0.4}},
+    {"sum takes the cheap one", 1, {1, 1},     {2},    {1, 2}, 1, 0, 0, {2, 0}},
+    {"sum, tie: shortest",    1, {1, 1},       {2},    {1, 1}, 1, 0, 0, {1, 1}},
+    {"sum, negative side",    1, {1, -1},      {-2},   {2, 1}, 1, 0, 0, {0, 2}},
+    {"largest levels out",    1, {1, 1},       {2},    {1, 2}, 3, 0, 0, {4.0 / 3, 2.0 / 3}},
+    {"largest, tie: shortest", 1, {1, 0},      {1},    {1, 1}, 3, 0, 0, {1, 0}},
+    {"inequality pulls",      1, {1, 1, -1, 0}, {1, -3}, {1, 1}, 2, 0, 0, {3, -2}},
+    {"sum over an inequality", 0, {-1, -2},    {-4},   {1, 1}, 1, 0, 0, {0, 2}},
+    {"all negative",          1, {1, 1},       {-2},   {1, 1}, 2, -1, 0, {-1, -1}},
+    {"sum, all negative",     1, {1, 3},       {-6},   {1, 1}, 1, -1, 0, {0, -2}},
+    {"sign decides",          1, {1, -1, -1, 0}, {1, -1}, {1, 1}, 2, 1, 0, {1, 0}},
+    {"loose bound of 1e30",   1, {1, 0, 1, 1}, {3, 1e30}, {1, 1}, 2, 0, 0, {3, 0}},
+    {"rows that say nothing", 1, {0, 0, 0, 0}, {0, 1}, {1, 1}, 2, 0, 0, {0, 0}},
+    {"repeated equality",     2, {1, 1, 2, 2}, {2, 4}, {1, 1}, 3, 1, 0, {1, 1}},
+    {"equality by inequalities", 0, {1, 1, -1, -1}, {2, -2}, {1, 1}, 1, 0, 0, {1, 1}},
+    {"free unknown, square",  1, {1, 1},       {2},    {1, 0}, 2, 0, 0, kAlmostFree},
+    {"free unknown, sum",     1, {1, 1},       {2},    {1, 0}, 1, 0, 0, {0, 2}},
+    {"free unknown, largest", 1, {1, 1},       {2},    {1, 0}, 3, 0, 0, {0, 2}},
+    {"all unknowns free",     1, {1, 1},       {2},    {0, 0}, 1, 0, 0, {1, 1}},
+    {"no rows",               0, {},           {},     {1, 1}, 1, 0, 0, {0, 0}},
+    {"overflowing unit mix",  1, {1e200, 1e-200}, {1e200}, {1e-150, 1e150}, 2, 0, 0, {1, 0}},
+    {"equalities contradict", 2, {1, 1, 1, 1}, {1, 2}, {1, 1}, 2, 0, 5, {}},
+    {"zero row, not zero",    1, {0, 0},       {1},    {1, 1}, 3, 0, 5, {}},
+    {"zero row, below zero",  0, {0, 0},       {-1},   {1, 1}, 1, 0, 6, {}},
+    {"bounds cross",          0, {1, 0, -1, 0}, {1, -2}, {1, 1}, 1, 0, 6, {}},
+    {"equality against bound", 1, {1, 1, 1, 1}, {2, 1}, {1, 1}, 3, 0, 6, {}},
+    {"other sign only",       1, {1, 1},       {-2},   {1, 1}, 2, 1, 7, {}},
+    {"other sign only, sum",  1, {1, 1},       {2},    {1, 1}, 1, -1, 7, {}},
+    {"met within 1e-9",       2, {1, 1, 1, 1}, {1, 1 + 2e-9}, {1, 1}, 2, 0, 9, {0.5, 0.5}},
+    {"objective 0",           1, {1, 1},       {2},    {1, 1}, 0, 0, -1, {}},
+    {"objective 4",           1, {1, 1},       {2},    {1, 1}, 4, 0, -1, {}},
+    {"NaN in a row",          1, {1, kNan},    {2},    {1, 1}, 2, 0, 4, {}},
+    {"NaN before the objective", 1, {1, kNan}, {2},    {1, 1}, 9, 0, 4, {}},
+    {"infinite right-hand side", 0, {1, 1},    {kInf}, {1, 1}, 2, 0, 4, {}},
+    {"NaN weight",            1, {1, 1},       {2},    {1, kNan}, 2, 0, 4, {}},
+    {"negative weight",       1, {1, 1},       {2},    {1, -1}, 2, 0, 4, {}},
+    {"sign 2",                1, {1, 1},       {2},    {1, 1}, 2, 2, 4, {}},
+    {"more equalities than rows", 2, {1, 1},   {2},    {1, 1}, 2, 0, 4, {}},
+    {"negative count",        -1, {1, 1},      {2},    {1, 1}, 2, 0, 4, {}},
+    {"matrix too short",      1, {1},          {2},    {1, 1}, 2, 0, 4, {}},
+    {"no unknowns",           0, {},           {},     {},     2, 0, 4, {}},
 };
 // clang-format on
 
@@ -88,19 +89,20 @@ struct T_SYSTEM {
 
 // clang-format off
 const T_SYSTEM kSystems[] = {
-    { "regular",                 2, {2, 1, 1, 3},             {5, 10},     {1, 1},    {1, 3},       {} },
-    { "mixed units",             2, {2e9, 1e-9, 1e9, 3e-9},   {5e0, 1e1},  {1, 1},    {1e-9, 3e9},  {} },
-    { "weights do not matter",   2, {2, 1, 1, 3},             {5, 10},     {1e-6, 0}, {1, 3},       {} },
-    { "singular: shortest",      2, {1, 1, 2, 2},             {2, 4},      {1, 1},    {1, 1},       {} },
-    { "singular, by weight",     2, {1, 1, 2, 2},             {2, 4},      {1, 2},    {1.6, 0.4},   {} },
-    { "singular, scaled rows",   2, {1e-9, 1e-9, 2e6, 2e6},   {2e-9, 4e6}, {1, 1},    {1, 1},       {} },
-    { "all zero",                2, {0, 0, 0, 0},             {0, 0},      {1, 1},    {0, 0},       {} },
-    { "contradictory: between",  2, {1, 0, 1, 0},             {1, 2},      {1, 1},    {1.5, 0},     {0, 1} },
-    { "rows weigh alike",        2, {1, 0, 1e6, 0},           {1, 2e6},    {1, 1},    {1.5, 0},     {0, 1} },
-    { "zero row, not zero",      2, {1, 1, 0, 0},             {2, 3},      {1, 1},    {1, 1},       {1} },
-    { "one row is met",          3, {1,0,0, 1,0,0, 0,0,1},    {1, 3, 5},   {1, 1, 1}, {2, 0, 5},    {0, 1} },
-    { "met to 1e-7 is met",      2, {1, 0, 1, 0},             {1, 1 + 2e-7}, {1, 1},  {1 + 1e-7, 0}, {} },
-    { "large beside small",      3, {1,0,0, 1,0,0, 0,0,1},    {1, 1.0001, 1e7}, {1, 1, 1}, {1.00005, 0, 1e7}, {0, 1} },
+    {"regular",             2, {2, 1, 1, 3},          {5, 10},    {1, 1}, {1, 3},     {}},
+    {"mixed units",         2, {2e9, 1e-9, 1e9, 3e-9}, {5e0, 1e1}, {1, 1}, {1e-9, 3e9}, {}},
+    {"weights do not matter", 2, {2, 1, 1, 3},        {5, 10},    {1e-6, 0}, {1, 3},  {}},
+    {"singular: shortest",  2, {1, 1, 2, 2},          {2, 4},     {1, 1}, {1, 1},     {}},
+    {"singular, by weight", 2, {1, 1, 2, 2},          {2, 4},     {1, 2}, {1.6, 0.4}, {}},
+    {"singular, scaled rows", 2, {1e-9, 1e-9, 2e6, 2e6}, {2e-9, 4e6}, {1, 1}, {1, 1}, {}},
+    {"all zero",            2, {0, 0, 0, 0},          {0, 0},     {1, 1}, {0, 0},     {}},
+    {"contradictory: between", 2, {1, 0, 1, 0},       {1, 2},     {1, 1}, {1.5, 0},   {0, 1}},
+    {"rows weigh alike",    2, {1, 0, 1e6, 0},        {1, 2e6},   {1, 1}, {1.5, 0},   {0, 1}},
+    {"zero row, not zero",  2, {1, 1, 0, 0},          {2, 3},     {1, 1}, {1, 1},     {1}},
+    {"one row is met",      3, {1,0,0, 1,0,0, 0,0,1}, {1, 3, 5},  {1, 1, 1}, {2, 0, 5}, {0, 1}},
+    {"met to 1e-7 is met",  2, {1, 0, 1, 0},          {1, 1 + 2e-7}, {1, 1}, {1 + 1e-7, 0}, {}},
+    {"large beside small",  3, {1,0,0, 1,0,0, 0,0,1}, {1, 1.0001, 1e7}, {1, 1, 1},
+     {1.00005, 0, 1e7}, {0, 1}},
 };
 // clang-format on
 

@@ -3,6 +3,7 @@
 #include "qm_base/messagehistory.h"
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+#include "qm_db/editscope.h"
 
 #include <algorithm>
 
@@ -80,8 +81,8 @@ T_ULF_COMBINATION_PLAN PlanUlfCombinations(const std::string& name, const T_LCOM
 
 int AddUlfCombinations(CDBDoc& doc, const std::string& name, const T_ULF_COMBINATION_PLAN& plan)
 {
-    CEditData& edit = doc.Edit();
-    if (!edit.Begin(name)) return 0;
+    CEditScope edit(doc, name);
+    if (!edit.IsOpen()) return 0;
     const int all = plan.split ? AddParts(doc, name, plan.parts) : Add(doc, plan.parts.front());
     return edit.Commit() && all;
 }

@@ -1,4 +1,3 @@
-#include "qm_rps/factors/ulfitemchecks.h"
 #include "qm_rps/factors/ulfstageplace.h"
 #include "qm_rps/factors/ulfstageproblem.h"
 #include "qm_rps/factors/ulfstageresponse.h"
@@ -6,7 +5,6 @@
 #include "twotrusses.h"
 
 #include <algorithm>
-#include <cmath>
 #include <gtest/gtest.h>
 
 namespace {
@@ -134,77 +132,6 @@ TEST(StageProblem, MovesKnownRowsAndReadsConstraintsAtTheirPlace)
     ASSERT_EQ(2U, f.problem.constraints.size());
     EXPECT_EQ((T_OPT_RECORD{1, 4, 1, 2, -1, 1, 0, 0, 3002}), f.problem.constraints[0]);
     EXPECT_EQ((T_OPT_RECORD{1, 4, 1, -1, 1, 1, 0, 0, 3002}), f.problem.constraints[1]);
-}
-
-TEST(StageProblem, NamesEachRuleThatAnItemDoesNotKeepAndItsRow)
-{
-    CDBDoc doc;
-    doc.Data().Assign(two::Content());
-    const T_ULSI_D good = doc.Data().Model().ulfStageItems.at(1);
-    using ITEM = T_ULSI_D;
-    struct T_CASE {
-        const char* key;   // of the rule, or of the message where that says it all
-        const char* field; // where it is
-        const char* says;  // in its text
-        void (*spoil)(ITEM&);
-    };
-    const T_CASE cases[] = {
-        {"IDS_RPS_No_Item_Name_", "name", "", [](ITEM& i) { i.name.clear(); }},
-        {"IDS_QM_ULSI_PLACE", "rows[1].step",
-         "STAY: row 1 (T): ", [](ITEM& i) { i.rows[0].step = 2; }},
-        {"IDS_QM_ULSI_PLACE", "rows[2].step", "row 2 (G): ", [](ITEM& i) { i.rows[1].stage = 9; }},
-        {"IDS_QM_ULSI_CASE", "rows[1].case",
-         "row 1 (S1/First Step): ", [](ITEM& i) { i.rows[0].loadCase = 9; }},
-        {"IDS_QM_ULSI_GROUP", "rows[1].load_group",
-         "row 1 (S1/First Step T): ", [](ITEM& i) { i.rows[0].loadGroup = 3; }},
-        {"IDS_QM_ULSI_NUMBER", "rows[1].factor", "row 1 ", [](ITEM& i) { i.rows[0].weight = -1; }},
-        {"IDS_QM_ULSI_NUMBER", "rows[2].factor",
-         "row 2 (S1/First Step G): ", [](ITEM& i) { i.rows[1].factor = NAN; }},
-        {"IDS_QM_ULSI_TWICE", "rows[3].case", "row 3 (S1/Last Step G): ",
-         [](ITEM& i) { // the only step is also the last one
-             i.rows.push_back(i.rows[1]);
-             i.rows[2].step = kStageLastStep;
-         }},
-        {"IDS_QM_ULFI_SIGN", "sign", "", [](ITEM& i) { i.sign = 3; }},
-        {"IDS_RPS_No_Unknown_Load_Factor_defined_", "rows", "",
-         [](ITEM& i) { i.rows.erase(i.rows.begin()); }},
-        {"IDS_QM_ULSI_NO_PRETENSION", "rows[1].pretension", "row 1 ",
-         [](ITEM& i) { i.rows[0].loadCase = 1; }},
-        {"IDS_QM_ULSI_SCALED_TWICE", "rows[3].pretension", "row 3 (S1/Last Step T): ",
-         [](ITEM& i) {
-             i.rows.push_back({1, kStageLastStep, 2, true, 1, 1, true, 0});
-         }},
-        {"IDS_RPS_No_constraint_defined_for_the_unknowns_", "constraints", "",
-         [](ITEM& i) { i.constraints.clear(); }},
-        {"IDS_QM_ULFI_NO_SUCH_CONSTRAINT", "constraints", "",
-         [](ITEM& i) { i.constraints = {"GONE"}; }},
-    };
-    EXPECT_TRUE(CheckUlfStageItem(good, 1, doc.Data()).empty());
-    for (const T_CASE& c : cases) {
-        ITEM item = good;
-        c.spoil(item);
-        const auto found = CheckUlfStageItem(item, 1, doc.Data());
-        EXPECT_EQ(1,
-                  std::ranges::count_if(found,
-                                        [&](const T_FINDING& f) {
-                                            return (f.ruleText == c.key || f.messageKey == c.key) &&
-                                                   f.field == c.field &&
-                                                   f.text.find(c.says) != std::string::npos;
-                                        }))
-            << c.key << (found.empty() ? "" : found[0].field + found[0].text);
-    }
-}
-
-TEST(StageProblem, NamesAreSharedWithStaticItems)
-{
-    T_MODEL_CONTENT content = two::Content();
-    CDBDoc doc;
-    const T_ULSI_D item = content.model.ulfStageItems.at(1);
-    doc.Data().Assign(content);
-    EXPECT_EQ("IDS_QM_ULFI_NAME_EXISTS", CheckUlfStageItem(item, 0, doc.Data()).at(0).ruleText);
-    content.model.ulfItems[1].name = item.name;
-    doc.Data().Assign(content);
-    EXPECT_EQ("IDS_QM_ULFI_NAME_EXISTS", CheckUlfStageItem(item, 1, doc.Data()).at(0).ruleText);
 }
 
 TEST(StageProblem, ScalesItsOwnLoadOrAllThatActAtItsStep)

@@ -1,5 +1,6 @@
 #include "qm_solver/ulfdiagnosis.h"
 
+#include "numbers.h"
 #include "ulfplanted.h"
 
 #include "qm_solver/ulfsolver.h"
@@ -123,13 +124,14 @@ TEST(UlfDiagnosis, TheCompromiseSharesTheViolation)
     };
     // clang-format off
     const T_CASE cases[] = { // two unknowns, weight 1
-        { "two equalities",       2,  0, {1, 0, 1, 0},         {1, 2},     {1.5, 0},   {0.5, -0.5},   0.5 },
-        { "units do not weigh",   2,  0, {1, 0, 1e6, 0},       {1, 2e6},   {1.5, 0},   {0.5, -5e5},   0.5 },
-        { "bounds cross",         0,  0, {1, 0, -1, 0},        {1, -2},    {1.5, 0},   {0.5, 0.5},    0.5 },
-        { "third row is kept",    0,  0, {1, 0, -1, 0, 0, -1}, {1, -2, -3},{1.5, 3},   {0.5, 0.5, 0}, 0.5 },
-        { "sign is never broken", 1,  1, {1, 0},               {-2},       {0, 0},     {2},           4.0 },
-        { "sign, other unknown",  1, -1, {3, -4},              {-8},       {-8.0 / 3, 0}, {0},        0.0 },
-        { "already met",          1,  0, {1, 1},               {2},        {1, 1},     {0},           0.0 },
+        {"two equalities",     2, 0, {1, 0, 1, 0},  {1, 2},  {1.5, 0}, {0.5, -0.5}, 0.5},
+        {"units do not weigh", 2, 0, {1, 0, 1e6, 0}, {1, 2e6}, {1.5, 0}, {0.5, -5e5}, 0.5},
+        {"bounds cross",       0, 0, {1, 0, -1, 0}, {1, -2}, {1.5, 0}, {0.5, 0.5},  0.5},
+        {"third row is kept",  0, 0, {1, 0, -1, 0, 0, -1}, {1, -2, -3}, {1.5, 3},
+         {0.5, 0.5, 0}, 0.5},
+        {"sign is never broken", 1, 1, {1, 0},      {-2},    {0, 0},   {2},         4.0},
+        {"sign, other unknown", 1, -1, {3, -4},     {-8},    {-8.0 / 3, 0}, {0},    0.0},
+        {"already met",        1, 0, {1, 1},        {2},     {1, 1},   {0},         0.0},
     };
     // clang-format on
     const T_VECTOR weights{1, 1};
@@ -256,7 +258,7 @@ TEST(UlfDiagnosis, BadInputAndSolvableProblemsAreToldApart)
     const T_TUNING good;
     EXPECT_EQ(ULF_CONFLICT::Solvable, CUlfDiagnosis().Conflict(good.Problem(2), {}).state);
     T_TUNING bad;
-    bad.rhs[1] = std::numeric_limits<double>::quiet_NaN();
+    bad.rhs[1] = kNan;
     T_ULF_EXPLANATION e;
     T_ULF_MATRIX m;
     T_ULF_COMPROMISE c;

@@ -1,0 +1,117 @@
+#include "qm_rps/unknownloadfactorresultdlg.h"
+
+#include "tempfolder.h"
+#include "ulfdocument.h"
+
+#include "qm_base/messagehistory.h"
+#include "qm_base/msgfunction.h"
+#include "qm_rps/unknownloadfactoritemdlg.h"
+
+#include <gtest/gtest.h>
+
+namespace {
+
+using zql::lib::MMSGFunction;
+
+struct UnknownLoadFactorResult : testing::Test {
+    UnknownLoadFactorResult()
+    {
+        five::Fill(m_doc);
+        m_result = CUnknownLoadFactorItemDlg(m_doc, 1).Calculate().result.value();
+        (void)TakeMessageHistory();
+    }
+    CDBDoc m_doc;
+    T_ULF_RESULT m_result;
+};
+
+} // namespace
+
+TEST_F(UnknownLoadFactorResult, MakesALoadCombinationFromTheFactors)
+{
+    CUnknownLoadFactorResultDlg dlg(m_doc, m_result);
+    (void)TakeMessageHistory();
+    const auto refused = [&](const char* name, const char* key) {
+        dlg.m_combinationName = name;
+        EXPECT_EQ(0, dlg.OnMakeCombination());
+        EXPECT_EQ(std::vector<std::string>{MMSGFunction::Format(key, {name})},
+                  TakeMessageHistory());
+    };
+    refused("", "IDS_RPS_UNKNOWN_LOAD_NAME_NOTENTERED");
+    refused("C1", "IDS_RPS_UNKNOWN_LOAD_LCOM_EXIST");
+    EXPECT_EQ(1u, m_doc.Data().Model().combinations.size());
+
+    dlg.m_combinationName = "tuned";
+    EXPECT_EQ(1, dlg.OnMakeCombination());
+    EXPECT_EQ(std::vector<std::string>{MMSGFunction::Format("IDS_RPS_UNKNOWN_LOAD_LCOM_SUCCESS",
+                                                            {"tuned"})},
+              TakeMessageHistory());
+    const T_LCOM_D& made = m_doc.Data().Model().combinations.at(2);
+    EXPECT_EQ("tuned", made.name);
+    ASSERT_EQ(5u, made.items.size());
+    EXPECT_EQ((T_LCOM_ITEM{false, 2, m_result.factors[1]}), made.items[1]);
+    // The combination brings the beam where the constraints want it.
+    T_DOF6 u{};
+    ASSERT_TRUE(m_doc.Post().SelectLoadCombNew(2) && m_doc.Post().GetDispNew(3, u));
+    EXPECT_NEAR(0.0, u[2], 1e-12);
+    EXPECT_EQ(1, m_doc.Undo().Undo());
+    EXPECT_EQ(1u, m_doc.Data().Model().combinations.size());
+}
+
+TEST_F(UnknownLoadFactorResult, SplitsCombinationsAndGoesOnAfterARefusedOne)
+{
+    T_MODEL_CONTENT content = m_doc.Data().Content();
+    T_LCOM_D& base = content.model.combinations[1];
+    base.items.clear();
+    T_ULF_RESULT result;
+    result.item.combination = 1;
+    for (int key = 1; key <= 999; ++key) {
+        content.model.loadCases[key].name = "L" + std::to_string(key);
+        base.items.push_back({false, key, 2.0});
+        result.cases.push_back({key, "", 2.0});
+        result.factors.push_back(3.0);
+    }
+    content.model.combinations[5] = {"taken-2", {{false, 1, 1.0}}};
+    m_doc.Data().Assign(content);
+    const auto make = [&](const char* name) {
+        CUnknownLoadFactorResultDlg dlg(m_doc, result);
+        dlg.m_combinationName = name;
+        return dlg.OnMakeCombination();
+    };
+    (void)TakeMessageHistory();
+    EXPECT_EQ(1, make("frame"));
+    EXPECT_EQ(3u, TakeMessageHistory().size());
+    const auto at = [&](const char* name) {
+        T_LCOM_D c;
+        EXPECT_EQ(1, m_doc.Attr().GetLcom_(name, c)) << name;
+        return c.items;
+    };
+    EXPECT_EQ(999u, at("frame-1").size());
+    EXPECT_EQ(6.0, at("frame-1")[998].factor); // multiplied
+    EXPECT_TRUE(at("frame-2").empty());
+    EXPECT_EQ((std::vector<T_LCOM_ITEM>{{true, 6, 1.0}, {true, 7, 1.0}}), at("frame"));
+    EXPECT_EQ(1, m_doc.Undo().Undo()); // all three in one edit
+    EXPECT_EQ(2u, m_doc.Data().Model().combinations.size());
+
+    EXPECT_EQ(0, make("taken"));
+    const std::vector<std::string> lines = TakeMessageHistory();
+    ASSERT_EQ(3u, lines.size());
+    EXPECT_EQ(MMSGFunction::Format("IDS_RPS_UNKNOWN_LOAD_LCOM_FAIL", {"taken-2"}), lines[1]);
+    EXPECT_EQ(1u, at("taken").size()); // the part that was added
+}
+
+TEST_F(UnknownLoadFactorResult, ExportsTheSheetOrSaysWhyNot)
+{
+    CUnknownLoadFactorResultDlg dlg(m_doc, m_result);
+    const CTempFolder folder;
+    const std::string path = folder / "sheet.xlsx";
+    EXPECT_EQ(1, dlg.OnExport(path, {16, 2024, 5, 6, "five"}));
+    EXPECT_GT(std::filesystem::file_size(path), 1000u);
+    EXPECT_EQ(0, dlg.OnExport(folder / "missing/x.xlsx", {}));
+    EXPECT_EQ("IDS_QM_ULF_SHEET_NOT_WRITTEN", dlg.Messages().back().key);
+    T_ULF_RESULT wide = m_result;
+    wide.constraints.resize(231);
+    CUnknownLoadFactorResultDlg old(m_doc, wide);
+    EXPECT_EQ(0, old.OnExport(folder / "old.xlsx", {11, 0, 0, 0, {}}));
+    EXPECT_EQ("IDS_RPS_UNKNOWN_LOAD_EXCEED_COLUMN_ERROR", old.Messages().back().key);
+    EXPECT_EQ(1u, folder.Names().size());
+}
