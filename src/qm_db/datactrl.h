@@ -2,67 +2,8 @@
 #pragma once
 
 #include "qm_db/modelstore.h"
+#include "qm_db/records/tables.h"
 #include "qm_db/results/stagedresult.h"
-
-/// Where the model keeps the table of a record type.
-template <class T>
-inline constexpr T_TABLE<T> T_MODEL::*kTableOf = nullptr;
-template <>
-inline constexpr T_TABLE<T_NODE_D> T_MODEL::*kTableOf<T_NODE_D> = &T_MODEL::nodes;
-template <>
-inline constexpr T_TABLE<T_STOR_D> T_MODEL::*kTableOf<T_STOR_D> = &T_MODEL::storeys;
-template <>
-inline constexpr T_TABLE<T_EIGV_D> T_MODEL::*kTableOf<T_EIGV_D> = &T_MODEL::modes;
-template <>
-inline constexpr T_TABLE<T_SPFC_D> T_MODEL::*kTableOf<T_SPFC_D> = &T_MODEL::spectra;
-template <>
-inline constexpr T_TABLE<T_POLC_D> T_MODEL::*kTableOf<T_POLC_D> = &T_MODEL::pushovers;
-template <>
-inline constexpr T_TABLE<T_EVAL_D> T_MODEL::*kTableOf<T_EVAL_D> = &T_MODEL::evaluations;
-template <>
-inline constexpr T_TABLE<T_POVR_D> T_MODEL::*kTableOf<T_POVR_D> = &T_MODEL::poverSteps;
-template <>
-inline constexpr T_TABLE<T_MATL_D> T_MODEL::*kTableOf<T_MATL_D> = &T_MODEL::materials;
-template <>
-inline constexpr T_TABLE<T_SECT_D> T_MODEL::*kTableOf<T_SECT_D> = &T_MODEL::sections;
-template <>
-inline constexpr T_TABLE<T_ELEM_D> T_MODEL::*kTableOf<T_ELEM_D> = &T_MODEL::elements;
-template <>
-inline constexpr T_TABLE<T_PHGT_D> T_MODEL::*kTableOf<T_PHGT_D> = &T_MODEL::hingeTypes;
-template <>
-inline constexpr T_TABLE<T_PHGE_D> T_MODEL::*kTableOf<T_PHGE_D> = &T_MODEL::hinges;
-template <>
-inline constexpr T_TABLE<T_IEHP_D> T_MODEL::*kTableOf<T_IEHP_D> = &T_MODEL::inelasticHinges;
-template <>
-inline constexpr T_TABLE<T_POFC_D> T_MODEL::*kTableOf<T_POFC_D> = &T_MODEL::incrementFunctions;
-template <>
-inline constexpr T_TABLE<T_DIAP_D> T_MODEL::*kTableOf<T_DIAP_D> = &T_MODEL::diaphragms;
-template <>
-inline constexpr T_TABLE<T_EQDS_D> T_MODEL::*kTableOf<T_EQDS_D> = &T_MODEL::equalDisplacements;
-template <>
-inline constexpr T_TABLE<T_STLD_D> T_MODEL::*kTableOf<T_STLD_D> = &T_MODEL::loadCases;
-template <>
-inline constexpr T_TABLE<T_LCOM_D> T_MODEL::*kTableOf<T_LCOM_D> = &T_MODEL::combinations;
-template <>
-inline constexpr T_TABLE<T_ULFC_D> T_MODEL::*kTableOf<T_ULFC_D> = &T_MODEL::ulfConstraints;
-template <>
-inline constexpr T_TABLE<T_ULFI_D> T_MODEL::*kTableOf<T_ULFI_D> = &T_MODEL::ulfItems;
-template <>
-inline constexpr T_TABLE<T_STAG_D> T_MODEL::*kTableOf<T_STAG_D> = &T_MODEL::stages;
-template <>
-inline constexpr T_TABLE<T_ULSI_D> T_MODEL::*kTableOf<T_ULSI_D> = &T_MODEL::ulfStageItems;
-
-/// Table of a record type: nodes for T_NODE_D, and so on.
-template <class T>
-T_TABLE<T>& TableOf(T_MODEL& model)
-{
-    return model.*kTableOf<T>;
-}
-template <class T>
-const T_TABLE<T>& TableOf(const T_MODEL& model)
-{
-    return model.*kTableOf<T>;
-}
 
 class CEditData;
 

@@ -44,7 +44,7 @@ public:
     template <class T>
     [[nodiscard]] int Erase(int key, T_RECORD_USERS& users)
     {
-        users = UsersOf<T>(m_data.Model(), key);
+        users = UsersOf(m_data.Model(), KindOf<T>(), key);
         if (!m_open || !users.empty() || !TableOf<T>(m_data.Model()).contains(key)) return 0;
         return Change<T>(key, nullptr);
     }

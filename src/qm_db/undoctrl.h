@@ -16,13 +16,9 @@ struct T_CHANGE {
     std::shared_ptr<const T> after;  // of a hinge type
 };
 
-using T_CHANGE_ANY =
-    std::variant<T_CHANGE<T_STYP_D>, T_CHANGE<T_NODE_D>, T_CHANGE<T_STOR_D>, T_CHANGE<T_EIGV_D>,
-                 T_CHANGE<T_SPFC_D>, T_CHANGE<T_POLC_D>, T_CHANGE<T_EVAL_D>, T_CHANGE<T_MATL_D>,
-                 T_CHANGE<T_SECT_D>, T_CHANGE<T_ELEM_D>, T_CHANGE<T_PHGT_D>, T_CHANGE<T_PHGE_D>,
-                 T_CHANGE<T_IEHP_D>, T_CHANGE<T_POFC_D>, T_CHANGE<T_DIAP_D>, T_CHANGE<T_EQDS_D>,
-                 T_CHANGE<T_STLD_D>, T_CHANGE<T_LCOM_D>, T_CHANGE<T_ULFC_D>, T_CHANGE<T_ULFI_D>,
-                 T_CHANGE<T_STAG_D>, T_CHANGE<T_ULSI_D>>;
+template <class... R>
+std::variant<T_CHANGE<T_STYP_D>, T_CHANGE<R>...> ChangeOf(const std::tuple<T_RECORD_ROW<R>...>&);
+using T_CHANGE_ANY = decltype(ChangeOf(kRecords)); // of any record
 
 /// What one command of the user changed.
 struct T_UNDO_STEP {

@@ -1,6 +1,6 @@
 // Edits of hinges in a document: units, undo, deletion, members, conversion.
+#include "qm_db/casefile/caseput.h"
 #include "qm_db/dbdoc.h"
-#include "qm_db/store/recordbody.h"
 
 #include <cmath>
 #include <gtest/gtest.h>
@@ -100,10 +100,13 @@ T_UNITS UnitsOf(int i)
 
 std::string BodyOf(const T_PHGT_D& type)
 {
-    std::string text;
-    T_FILE_ERROR error;
-    EXPECT_EQ(1, PrintBody(type, text, error)) << error.text;
-    return text;
+    CJsonWriter out(kSiUnits);
+    CCasePut put(out);
+    out.BeginObject();
+    CaseFields(put, type);
+    out.EndObject();
+    EXPECT_FALSE(out.Failed()) << out.Error().text;
+    return out.TakeText();
 }
 
 } // namespace
@@ -145,7 +148,7 @@ TEST(HingeEdit, AStoredHingeKeepsItsMeaningInAllPairsOfUnits)
             T_PHGE_D hinge;
             ASSERT_TRUE(doc.Attr().GetSect(1, sect) && doc.Attr().GetMatl(1, matl) &&
                         doc.Attr().GetPhge(1, hinge) && doc.Attr().GetPolc(1, push) &&
-                        doc.Attr().GetIehp(1, iehp));
+                        doc.Attr().Get(1, iehp));
             EXPECT_DOUBLE_EQ(f(0, 1), sect.size[0]);
             EXPECT_DOUBLE_EQ(f(0, 2), sect.area);
             EXPECT_DOUBLE_EQ(f(0, 4), sect.Iyy);

@@ -2,7 +2,9 @@
 #pragma once
 
 #include "qm_db/casefile/jsonreader.h"
+#include "qm_db/records/casenames.h"
 #include "qm_db/records/hingefields.h"
+#include "qm_db/records/pushfields.h"
 #include "qm_db/records/stagefields.h"
 
 #include <cmath>
@@ -79,18 +81,21 @@ public:
         Read(member, out, dim);
     }
     /// Returns the key that is there, `key` when neither is.
-    const char* OptOr(const char* key, const char* old, double& out, double missing, T_DIM dim)
-    {
-        const bool older = old && Has(old);
-        if (older && Has(key))
-            m_in.FailAt(key, std::string("the same as \"") + old + "\", which is there too");
-        Opt(older ? old : key, out, missing, dim);
-        return older ? old : key;
-    }
+    const char* OptOr(const char* key, const char* old, double& out, double missing, T_DIM dim);
     template <class T>
     void OptIf(const char* key, std::optional<T>& out, T_DIM dim = kDimNone)
     {
         if (Has(key)) Need(key, out.emplace(), dim);
+    }
+    template <class T>
+    void State(const char* key, T& out)
+    {
+        if (Has(key)) Need(key, out);
+    }
+    template <std::size_t N>
+    void StateFixed(const char* key, std::array<double, N>& out, const std::array<T_DIM, N>& dims)
+    {
+        if (Has(key)) NeedFixed(key, out, dims);
     }
     template <std::size_t N>
     void NeedFixed(const char* key, std::array<double, N>& out, const std::array<T_DIM, N>& dims)
@@ -118,34 +123,24 @@ public:
             out[static_cast<std::size_t>(item.Choice(names, what))] = true;
         });
     }
-    void Texts(const char* key, std::vector<std::string>& out)
-    {
-        if (!Has(key)) return;
-        m_in.Member(key).ForEachItem(
-            [&](CJsonReader& item, std::size_t) { item.Read(out.emplace_back()); });
-    }
+    void Texts(const char* key, std::vector<std::string>& out);
     /// 0 when it is left out.
-    void OptRef(const char* key, int& out, CASE_REF kind)
+    void OptRef(const char* key, int& out, RECORD_KIND kind)
     {
         out = 0;
         if (Has(key)) NeedRef(key, out, kind);
     }
-    void NeedRef(const char* key, int& out, CASE_REF kind)
+    void NeedRef(const char* key, int& out, RECORD_KIND kind);
+    void KeyRef(const char* key, int& out, RECORD_KIND kind);
+    void OptKeyRef(const char* key, int& out, RECORD_KIND kind)
     {
-        if (!Take(key)) return;
-        CJsonReader member = m_in.Member(key);
-        const bool byKey = kind == CASE_REF::Material || kind == CASE_REF::Section;
-        if (!m_names || (byKey && !member.IsText())) {
-            member.Read(out);
-            if (m_names && out != 0 && !m_names->HasKey(kind, out)) FailRef(member, kind);
-            return;
-        }
-        std::string name;
-        member.Read(name);
-        const std::optional<int> found = m_names->KeyOf(kind, name);
-        if (!found) FailRef(member, kind);
-        out = found.value_or(0);
+        Opt(key, out, 0);
+        if (out != 0) KeyRef(key, out, kind);
     }
+    void NameRef(const char* key, std::string& out, RECORD_KIND) { Need(key, out); }
+    void NameRefs(const char* key, std::vector<std::string>& out, RECORD_KIND) { Texts(key, out); }
+    /// One node or two; `reason` when there are others.
+    void NodePair(const char* key, int& nodeI, int& nodeJ, std::size_t count, const char* reason);
     void Node(const char* key, int& id)
     {
         Need(key, id);
@@ -168,28 +163,9 @@ public:
         ids.clear();
         if (Has(key)) NodeList(key, ids);
     }
-    void OptElements(const char* key, std::vector<int>& ids)
-    {
-        ids.clear();
-        if (!Has(key)) return;
-        Need(key, ids);
-        CheckIds(
-            key, ids, [&](int id) { return m_names->HasElement(id); }, "there is no such element",
-            "the element appears twice");
-    }
+    void OptElements(const char* key, std::vector<int>& ids);
     /// "first", "last" or a number from 1.
-    void StageStep(const char* key, int& step, int missing)
-    {
-        step = missing;
-        if (!Has(key)) return;
-        CJsonReader member = m_in.Member(key);
-        if (member.IsText()) {
-            step = member.Choice(kStageStepNames, "step") == 0 ? kStageFirstStep : kStageLastStep;
-            return;
-        }
-        member.Read(step);
-        if (step < kStageFirstStep) member.Fail("steps count from 1");
-    }
+    void StageStep(const char* key, int& step, int missing);
     /// A fault of a case file unless `ok`; a member that is left out is not judged.
     void Check(const char* key, bool ok, const char* reason)
     {
@@ -209,11 +185,43 @@ public:
         else
             m_in.Fail(reason);
     }
-    template <class E>
+    template <int kFirst = 0, class E>
     void Enum(const char* key, E& out, std::span<const char* const> names, const char* what)
     {
-        if (Take(key)) out = static_cast<E>(m_in.Choice(key, names, what));
+        if (Take(key)) out = static_cast<E>(kFirst + m_in.Choice(key, names, what));
     }
+    template <class E>
+    void EnumIf(const char* key, std::optional<E>& out, std::span<const char* const> names,
+                const char* what)
+    {
+        if (Has(key)) Enum(key, out.emplace(), names, what);
+    }
+    void Letter(const char* key, char& out, std::span<const char* const> names, const char* what)
+    {
+        if (Take(key)) out = *Word(key, names, what);
+    }
+    void LetterIf(const char* key, std::optional<char>& out, std::span<const char* const> names,
+                  const char* what)
+    {
+        if (Has(key)) out = *Word(key, names, what);
+    }
+    void WordIf(const char* key, std::optional<std::string>& out,
+                std::span<const char* const> names, const char* what)
+    {
+        if (Has(key)) out = Word(key, names, what);
+    }
+    template <class... T>
+    void Variant(const char* key, std::variant<T...>& out, std::span<const char* const> names,
+                 const char* what)
+    {
+        static const std::array<std::variant<T...>, sizeof...(T)> kBlank{T{}...};
+        std::size_t index = 0;
+        Must(key); // before what depends on it
+        Enum(key, index, names, what);
+        out = kBlank[index];
+    }
+    /// {"12": [...]}, six components by node.
+    void NodeTable(const char* key, std::map<int, T_DOF6>& out);
     template <int kFirst = 0, class E>
     void EnumOpt(const char* key, E& out, E missing, std::span<const char* const> names,
                  const char* what)
@@ -253,6 +261,20 @@ public:
         if (r) return Part(key, *r, context...);
         m_keys.emplace_back(key);
     }
+    template <class F>
+    void Group(const char* key, const F& members)
+    {
+        if (Has(key)) NeedGroup(key, members);
+    }
+    template <class F>
+    void NeedGroup(const char* key, const F& members)
+    {
+        if (!Take(key)) return;
+        CJsonReader member = m_in.Member(key);
+        CCaseGet group(member, m_units, {}, m_names);
+        members(group);
+        group.Finish();
+    }
     template <class R, class... C>
     void List(const char* key, std::vector<R>& all, const C&... context)
     {
@@ -288,6 +310,10 @@ public:
     }
 
 private:
+    const char* Word(const char* key, std::span<const char* const> names, const char* what)
+    {
+        return names[static_cast<std::size_t>(m_in.Choice(key, names, what))];
+    }
     template <class R, class... C>
     void Nested(CJsonReader& in, R& r, const C&... context)
     {
@@ -305,10 +331,7 @@ private:
         m_in.CheckEach(
             key, ids, [&](int id) { return seen.insert(id).second; }, twice);
     }
-    static void FailRef(CJsonReader& in, CASE_REF kind)
-    {
-        in.Fail(std::string("there is no such ") + kCaseRefNames[static_cast<std::size_t>(kind)]);
-    }
+    static void FailRef(CJsonReader& in, RECORD_KIND kind);
 
     /// A missing member becomes a fault at the end: a wrong spelling is told first.
     bool Take(const char* key)

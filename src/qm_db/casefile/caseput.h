@@ -2,13 +2,26 @@
 #pragma once
 
 #include "qm_db/casefile/jsonwriter.h"
+#include "qm_db/records/casenames.h"
 #include "qm_db/records/hingefields.h"
+#include "qm_db/records/pushfields.h"
 #include "qm_db/records/stagefields.h"
 
 #include <algorithm>
 #include <bit>
 #include <cstdint>
 #include <type_traits>
+
+template <class R, class... Listed>
+constexpr bool kIsAnyOf = (std::is_same_v<R, Listed> || ...);
+
+/// Records that stand on one line.
+template <class R>
+constexpr bool kIsOneLine =
+    kIsAnyOf<R, T_NODE_D, T_ELEM_D, T_MATL_D, T_EQDS_D, T_ULFC_D, T_REBAR, T_SECT_FACTORS,
+             T_NODAL_LOAD, T_BEAM_LOAD, T_SETTLEMENT, T_TEMPERATURE_LOAD, T_PTNS_D, T_LCOM_ITEM,
+             T_ULFI_UNKNOWN, T_STAG_LOAD, T_ULSI_ROW, T_SKEL_POINT, T_SIDES<double>, T_POLC_PATTERN,
+             T_POVR_D, T_SPFC_NTC_STATE, T_EVAL_BILINEAR>;
 
 class CCasePut {
 public:
@@ -29,11 +42,10 @@ public:
     void Need(const char* key, const T& value, T_DIM dim = kDimNone)
     {
         Begin(key);
-        if constexpr (std::is_same_v<T, int> || std::is_same_v<T, bool> ||
-                      std::is_same_v<T, std::string> || std::is_same_v<T, std::vector<int>>)
-            m_out.Value(value);
-        else
+        if constexpr (!std::is_integral_v<T> && requires { m_out.Value(value, dim); })
             m_out.Value(value, dim);
+        else
+            m_out.Value(value);
     }
     template <class T>
     void Opt(const char* key, const T& value, const T& missing, T_DIM dim = kDimNone)
@@ -49,6 +61,17 @@ public:
     void OptIf(const char* key, const std::optional<T>& value, T_DIM dim = kDimNone)
     {
         if (value) Need(key, *value, dim);
+    }
+    template <class T>
+    void State(const char* key, const T& value)
+    {
+        Need(key, value);
+    }
+    template <std::size_t N>
+    void StateFixed(const char* key, const std::array<double, N>& values,
+                    const std::array<T_DIM, N>& dims)
+    {
+        NeedFixed(key, values, dims);
     }
     template <std::size_t N>
     void NeedFixed(const char* key, const std::array<double, N>& values,
@@ -81,17 +104,30 @@ public:
         Begin(key);
         m_out.Value(std::span<const std::string>(texts));
     }
-    void OptRef(const char* key, int target, CASE_REF kind)
+    void OptRef(const char* key, int target, RECORD_KIND kind)
     {
         if (target != 0) NeedRef(key, target, kind);
     }
-    void NeedRef(const char* key, int target, CASE_REF kind)
+    void NeedRef(const char* key, int target, RECORD_KIND kind)
     {
         if (!m_names) return Need(key, target);
         Begin(key);
         const std::string* const name = m_names->NameOf(kind, target);
         if (!name) return m_out.Fail("no name for the key " + std::to_string(target));
         m_out.Value(std::string_view(*name));
+    }
+    void KeyRef(const char* key, int target, RECORD_KIND) { Need(key, target); }
+    void OptKeyRef(const char* key, int target, RECORD_KIND) { Opt(key, target, 0); }
+    void NameRef(const char* key, const std::string& target, RECORD_KIND) { Need(key, target); }
+    void NameRefs(const char* key, const std::vector<std::string>& targets, RECORD_KIND)
+    {
+        Texts(key, targets);
+    }
+    void NodePair(const char* key, int nodeI, int nodeJ, std::size_t count, const char*)
+    {
+        const std::array<int, 2> nodes{nodeI, nodeJ};
+        Begin(key);
+        m_out.Value(std::span<const int>(nodes).first(count));
     }
     void Node(const char* key, int id) { Need(key, id); }
     void Element(const char* key, int id) { Need(key, id); }
@@ -122,10 +158,46 @@ public:
     void Rule(const A&...) const
     {
     }
-    template <class E>
+    template <int kFirst = 0, class E>
     void Enum(const char* key, E value, std::span<const char* const> names, const char*)
     {
-        WriteName(key, static_cast<int>(value), names);
+        WriteName(key, static_cast<int>(value) - kFirst, names);
+    }
+    template <class E>
+    void EnumIf(const char* key, const std::optional<E>& value, std::span<const char* const> names,
+                const char* what)
+    {
+        if (value) Enum(key, *value, names, what);
+    }
+    template <class... A>
+    void Letter(const char* key, char value, const A&...)
+    {
+        Begin(key);
+        m_out.Value(std::string_view(&value, 1));
+    }
+    template <class... A>
+    void LetterIf(const char* key, const std::optional<char>& value, const A&...)
+    {
+        if (value) Letter(key, *value);
+    }
+    template <class... A>
+    void WordIf(const char* key, const std::optional<std::string>& value, const A&...)
+    {
+        OptIf(key, value);
+    }
+    template <class... T>
+    void Variant(const char* key, const std::variant<T...>& value,
+                 std::span<const char* const> names, const char*)
+    {
+        WriteName(key, static_cast<int>(value.index()), names);
+    }
+    void NodeTable(const char* key, const std::map<int, T_DOF6>& values)
+    {
+        Begin(key);
+        m_out.BeginObject();
+        for (const auto& [node, components] : values)
+            m_out.Member(std::to_string(node), std::span<const double>(components));
+        m_out.EndObject();
     }
     template <int kFirst = 0, class E>
     void EnumOpt(const char* key, E value, E missing, std::span<const char* const> names,
@@ -144,14 +216,14 @@ public:
     template <class R, class... C>
     void Part(const char* key, const R& r, const C&... context)
     {
-        m_waiting.push_back({key, IsSmall<R>()});
+        m_waiting.push_back({key, kIsOneLine<R>});
         CaseFields(*this, r, context...);
         EndPart();
     }
     template <class R, class... C>
     void NeedPart(const char* key, const R& r, const C&... context)
     {
-        m_waiting.push_back({key, IsSmall<R>()});
+        m_waiting.push_back({key, kIsOneLine<R>});
         BeginWaiting();
         CaseFields(*this, r, context...);
         EndPart();
@@ -161,6 +233,22 @@ public:
     {
         if (r) NeedPart(key, *r, context...);
     }
+    /// On one line, left out when none of its members is written.
+    template <class F>
+    void Group(const char* key, const F& members)
+    {
+        m_waiting.push_back({key, true});
+        members(*this);
+        EndPart();
+    }
+    template <class F>
+    void NeedGroup(const char* key, const F& members)
+    {
+        m_waiting.push_back({key, false});
+        BeginWaiting();
+        members(*this);
+        EndPart();
+    }
     template <class R, class... C>
     void List(const char* key, const std::vector<R>& all, const C&... context)
     {
@@ -168,7 +256,7 @@ public:
         Begin(key);
         m_out.BeginArray();
         for (const R& r : all) {
-            m_out.BeginObject(IsSmall<R>());
+            m_out.BeginObject(kIsOneLine<R>);
             CCasePut item(m_out, m_names);
             CaseFields(item, r, context...);
             m_out.EndObject();
@@ -204,18 +292,6 @@ public:
     }
 
 private:
-    /// Records that stand on one line.
-    template <class R>
-    static constexpr bool IsSmall()
-    {
-        return std::is_same_v<R, T_REBAR> || std::is_same_v<R, T_POLC_PATTERN> ||
-               std::is_same_v<R, T_SKEL_POINT> || std::is_same_v<R, T_SECT_FACTORS> ||
-               std::is_same_v<R, T_SIDES<double>> || std::is_same_v<R, T_NODAL_LOAD> ||
-               std::is_same_v<R, T_BEAM_LOAD> || std::is_same_v<R, T_SETTLEMENT> ||
-               std::is_same_v<R, T_TEMPERATURE_LOAD> || std::is_same_v<R, T_PTNS_D> ||
-               std::is_same_v<R, T_LCOM_ITEM> || std::is_same_v<R, T_ULFI_UNKNOWN> ||
-               std::is_same_v<R, T_STAG_LOAD> || std::is_same_v<R, T_ULSI_ROW>;
-    }
     static bool Same(double a, double b) // -0.0 is not 0.0
     {
         return std::bit_cast<std::uint64_t>(a) == std::bit_cast<std::uint64_t>(b);

@@ -11,12 +11,10 @@
 /// The whole document. `folder` is where relative paths of recorder files start.
 void ReadCase(CJsonReader& root, const std::string& folder, T_MODEL_CONTENT& content);
 
-/// Design codes, hinge options, and the tables from the materials to the unknown load factor items.
-void ReadStructTables(CJsonReader& root, T_MODEL& model);
-/// Increment functions, hinge types and hinges.
-void ReadHingeTables(CJsonReader& root, T_MODEL& model);
-void ReadSpectra(CJsonReader& root, T_MODEL& model);
-void ReadPushovers(CJsonReader& root, const std::string& folder, T_MODEL_CONTENT& content);
+class CCaseNames;
+/// What a load case has beside its own members: results of another solver, limit-state steps.
+void ReadSteps(CJsonReader& in, const CCaseNames& names, const std::string& folder, int key,
+               const T_POLC_D& push, T_MODEL_CONTENT& content);
 void ReadEvaluations(CJsonReader& root, T_MODEL& model);
 
 /// "steps" of one load case, in SI.

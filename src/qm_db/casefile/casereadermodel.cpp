@@ -1,127 +1,142 @@
-#include "qm_db/casefile/casereader.h"
+#include "qm_db/casefile/casereadertable.h"
 #include "qm_db/casefile/jsonnames.h"
-#include "qm_db/records/structnames.h"
+#include "qm_db/records/lcomflatten.h"
 
 namespace {
 
-void ReadHead(CJsonReader& root, T_STYP_D& styp)
+/// What a table asks of its records beside what their lists of members say.
+template <class R>
+void CheckRecord(CJsonReader&, const R&)
+{
+}
+void CheckRecord(CJsonReader& in, const T_ELEM_D& e)
+{
+    in.Check("id", e.id > 0, "an element id must be above 0");
+}
+void CheckRecord(CJsonReader& in, const T_POFC_D& f)
+{
+    if (f.step.size() != f.factor.size())
+        in.FailAt("factor", std::to_string(f.factor.size()) + " values, expected " +
+                                std::to_string(f.step.size()));
+}
+
+void CheckRecord(CJsonReader& in, const T_SPFC_D& spectrum)
+{
+    const auto* const user = std::get_if<T_SPFC_USER>(&spectrum.data);
+    if (user && user->Sa.size() != user->T.size())
+        in.FailAt("Sa", std::to_string(user->Sa.size()) + " values, expected " +
+                            std::to_string(user->T.size()));
+}
+
+/// Names and keys of a table that is read already.
+template <class R>
+void AddNames(const T_TABLE<R>& table, CCaseNames& names)
+{
+    if constexpr (kHasName<R>) {
+        for (const auto& [key, record] : table)
+            names.Add(KindOf<R>(), record.name, key);
+    }
+}
+
+/// Names and keys of a table that is still to be read: combinations may refer to later ones.
+void AddNamesAhead(CJsonReader& root, const char* member, RECORD_KIND kind, CCaseNames& names)
+{
+    int last = 0;
+    ForEachRecord(root, member, [&](CJsonReader& item, std::size_t) {
+        std::string name;
+        item.Get("name", name);
+        last = ReadKey(item, last);
+        names.Add(kind, name, last);
+    });
+}
+
+void CheckCycles(CJsonReader& root, const T_MODEL& model)
+{
+    auto combination = model.combinations.begin();
+    ForEachRecord(root, "combinations", [&](CJsonReader& item, std::size_t) {
+        T_LCOM_D flat;
+        std::string reason;
+        if (!FlattenLcom(model, (combination++)->second, flat, reason)) item.Fail(reason);
+    });
+}
+
+void ReadHead(CJsonReader& root, T_MODEL& model)
 {
     std::string format;
     root.Get("format", format);
     if (format != kCaseFormat)
         root.FailAt("format", QuotedText(format) + ", expected " + QuotedText(kCaseFormat));
-    root.GetIf("title", styp.title);
-
-    CJsonReader units = root.Member("units");
-    units.Keys({"force", "length"});
-    styp.units.force = static_cast<FORCE_UNIT>(units.Choice("force", kForceNames, "unit"));
-    styp.units.length = static_cast<LENGTH_UNIT>(units.Choice("length", kLengthNames, "unit"));
-
-    root.Get("gravity", styp.gravity);
-    root.CheckIf("gravity", styp.gravity, IsAboveZero, "gravity must be above 0");
-    if (root.Has("plane"))
-        styp.plane = static_cast<MODEL_PLANE>(root.Choice("plane", kPlaneNames, "plane"));
-    RecordToSiChecked(root, styp, styp.units);
+    const CCaseNames names(model);
+    CCaseGet get(root, model.styp.units, {}, &names);
+    HeadFields(get, model.styp);
 }
 
-void ReadNode(CJsonReader& in, T_MODEL& model)
+/// The members of the document, whatever their order.
+void CheckKeys(CJsonReader& root)
 {
-    T_NODE_D node;
-    in.Keys({"id", "xyz", "mass", "restraint"});
-    in.Get("id", node.id);
-    in.Check("id", node.id > 0, "a node id must be above 0");
-    in.Get("xyz", node.xyz);
-    in.GetIf("mass", node.mass);
-    in.CheckEach("mass", node.mass, IsZeroOrAbove, "a mass can't be negative");
-    in.GetIf("restraint", node.restraint);
-    in.CheckEach(
-        "restraint", node.restraint, [](int r) { return r == 0 || r == 1; },
-        "a restraint is 0 or 1");
-    RecordToSiChecked(in, node, model.styp.units);
-    if (!model.nodes.emplace(node.id, node).second)
-        in.FailAt("id", "node " + std::to_string(node.id) + " appears twice");
-}
-
-void ReadStorey(CJsonReader& in, std::size_t index, T_MODEL& model, std::set<std::string>& taken)
-{
-    T_STOR_D storey;
-    in.Keys({"name", "height", "nodes"});
-    in.GetName("name", storey.name, taken);
-    in.Get("height", storey.height);
-    in.Check("height", storey.height > 0.0, "a storey height must be above 0");
-    in.Get("nodes", storey.nodes);
-    std::set<int> seen;
-    in.CheckEach(
-        "nodes", storey.nodes, [&](int n) { return model.nodes.contains(n); },
-        "there is no such node");
-    in.CheckEach(
-        "nodes", storey.nodes, [&](int n) { return seen.insert(n).second; },
-        "the node appears twice");
-    RecordToSiChecked(in, storey, model.styp.units);
-    model.storeys[static_cast<int>(index) + 1] = std::move(storey);
-}
-
-void ReadMode(CJsonReader& in, std::size_t index, T_MODEL& model)
-{
-    T_EIGV_D mode;
-    in.Keys({"period", "shape", "participation", "mass_percent"});
-    in.Get("period", mode.period);
-    in.Check("period", mode.period > 0.0, "a period must be above 0");
-    in.Member("shape").ForEachNode([&](CJsonReader& values, int node) {
-        if (!model.nodes.contains(node)) values.Fail("there is no such node");
-        values.Read(mode.shape[node]);
+    CKeysOf known;
+    known.Key("format");
+    CaseFields(known, T_STYP_D{});
+    ForEachKind([&](const auto& row) {
+        if (row.member) known.Key(row.member);
     });
-    in.Get("participation", mode.participation);
-    in.Get("mass_percent", mode.massPercent);
-    model.modes[static_cast<int>(index) + 1] = std::move(mode);
+    root.Keys(known.m_keys);
 }
+
+class CCaseTables {
+public:
+    CCaseTables(CJsonReader& root, const std::string& folder, T_MODEL_CONTENT& content)
+        : m_root(root), m_folder(folder), m_content(content)
+    {
+    }
+
+    template <class R>
+    void operator()(const T_RECORD_ROW<R>& row)
+    {
+        if constexpr (std::is_same_v<R, T_MATL_D>) {
+            CCaseGet options(m_root, m_model.styp.units);
+            OptionFields(options, m_model.styp);
+        }
+        if constexpr (std::is_same_v<R, T_LCOM_D>)
+            AddNamesAhead(m_root, row.member, KindOf<R>(), m_names);
+        if (!row.member) return;
+        Read(row);
+        if constexpr (std::is_same_v<R, T_LCOM_D>)
+            CheckCycles(m_root, m_model);
+        else if (row.noun)
+            AddNames(m_model.*row.table, m_names);
+    }
+
+private:
+    template <class R>
+    void Read(const T_RECORD_ROW<R>& row)
+    {
+        ReadTable(m_root, m_names, row, m_model, {},
+                  [](CJsonReader& in, int, const R& record) { CheckRecord(in, record); });
+    }
+    void Read(const T_RECORD_ROW<T_POLC_D>& row)
+    {
+        constexpr const char* kMore[] = {"steps", "limit_state_steps"};
+        ReadTable(m_root, m_names, row, m_model, kMore,
+                  [&](CJsonReader& in, int key, const T_POLC_D& push) {
+                      ReadSteps(in, m_names, m_folder, key, push, m_content);
+                  });
+    }
+    void Read(const T_RECORD_ROW<T_POVR_D>&) {}
+    void Read(const T_RECORD_ROW<T_EVAL_D>&) { ReadEvaluations(m_root, m_model); }
+
+    CJsonReader& m_root;
+    const std::string& m_folder;
+    T_MODEL_CONTENT& m_content;
+    T_MODEL& m_model = m_content.model;
+    CCaseNames m_names{m_model};
+};
 
 } // namespace
 
 void ReadCase(CJsonReader& root, const std::string& folder, T_MODEL_CONTENT& content)
 {
-    T_MODEL& model = content.model;
-    root.Keys({"format",
-               "title",
-               "units",
-               "gravity",
-               "plane",
-               "nodes",
-               "storeys",
-               "modes",
-               "design_codes",
-               "hinge_options",
-               "materials",
-               "sections",
-               "elements",
-               "diaphragms",
-               "equal_displacements",
-               "load_cases",
-               "combinations",
-               "stage_control",
-               "stages",
-               "ulf_constraints",
-               "ulf_items",
-               "ulf_stage_items",
-               "increment_functions",
-               "hinge_types",
-               "hinges",
-               "inelastic_hinges",
-               "spectra",
-               "pushover",
-               "evaluations"});
-    ReadHead(root, model.styp);
-    root.Member("nodes").ForEachItem(
-        [&](CJsonReader& item, std::size_t) { ReadNode(item, model); });
-    std::set<std::string> storeyNames;
-    ForEachRecord(root, "storeys", [&](CJsonReader& item, std::size_t index) {
-        ReadStorey(item, index, model, storeyNames);
-    });
-    ForEachRecord(root, "modes",
-                  [&](CJsonReader& item, std::size_t index) { ReadMode(item, index, model); });
-    ReadStructTables(root, model);
-    ReadHingeTables(root, model);
-    ReadSpectra(root, model);
-    ReadPushovers(root, folder, content);
-    ReadEvaluations(root, model);
+    CheckKeys(root);
+    ReadHead(root, content.model);
+    ForEachKind(CCaseTables(root, folder, content));
 }

@@ -1,17 +1,42 @@
-// Reads a table of records with names and keys out of a case file.
+// Reads a table of records out of a case file.
 #pragma once
 
 #include "qm_db/casefile/caseget.h"
 #include "qm_db/casefile/casereader.h"
 
-template <class R>
-constexpr bool kHasName = requires(R& r)
-{
-    r.name;
+/// The keys of a record's members.
+class CKeysOf : public CFieldLook<CKeysOf> {
+public:
+    template <class T>
+    using Ref = const T&;
+    void Key(const char* key) { m_keys.emplace_back(key); }
+    // Not those of what is inside a member.
+    template <class... A>
+    void Part(const char* key, const A&...)
+    {
+        Key(key);
+    }
+    template <class... A>
+    void PartIf(const char* key, const A&...)
+    {
+        Key(key);
+    }
+    template <class... A>
+    void List(const char* key, const A&...)
+    {
+        Key(key);
+    }
+    template <class... A>
+    void Group(const char* key, const A&...)
+    {
+        Key(key);
+    }
+
+    std::vector<std::string_view> m_keys;
 };
 
 /// Key of the next record: one more than the last, or a higher one that it states.
-inline int NextKey(CJsonReader& item, int last)
+inline int ReadKey(CJsonReader& item, int last)
 {
     int key = last + 1;
     item.GetIf("key", key);
@@ -19,34 +44,54 @@ inline int NextKey(CJsonReader& item, int last)
     return key;
 }
 
-/// Reads a table. Keys run 1, 2, 3, ... unless a record states a higher one. With `names` the
-/// references are names and the rules of a case file hold. check(item, record) judges the rest.
-template <class R, class F>
-void ReadTable(CJsonReader& root, std::string_view member, const T_UNITS& units,
-               const CCaseNames* names, T_TABLE<R>& out, F check)
+/// One record without its key; `more`: what stands beside its members. References are names, and
+/// the rules of a case file hold.
+template <class R>
+void ReadRecord(CJsonReader& item, const CCaseNames& names, const T_UNITS& units,
+                const T_RECORD_ROW<R>& row, std::span<const char* const> more,
+                std::set<std::string>& taken, R& record)
 {
-    std::set<std::string> taken;
-    ForEachRecord(root, member, [&](CJsonReader& item, std::size_t) {
-        R record;
-        CCaseGet get(item, units, {"key"}, names);
-        if constexpr (kHasName<R>) {
-            (void)get.Has("name");
-            CaseFields(get, record);
-            get.Finish();
-            item.GetName("name", record.name, taken);
-        } else {
-            CaseFields(get, record);
-            get.Finish();
-        }
-        const int key = NextKey(item, out.empty() ? 0 : out.rbegin()->first);
-        check(item, record);
-        out.insert_or_assign(out.end(), key, std::move(record));
-    });
+    // An unknown key is told before anything else, a number out of range after everything.
+    constexpr bool kWhole =
+        std::is_same_v<R, T_NODE_D> || std::is_same_v<R, T_STOR_D> || std::is_same_v<R, T_EIGV_D>;
+    // A load pattern may name a static load case that is not there.
+    constexpr bool kByRules = !std::is_same_v<R, T_POLC_D>;
+    CCaseGet get(item, kWhole ? kSiUnits : units, {}, kByRules ? &names : nullptr);
+    for (const char* const key : more)
+        (void)get.Has(key);
+    if (row.key == CASE_KEY::Stated) (void)get.Has("key");
+    if (kHasName<R>) (void)get.Has("name");
+    if constexpr (kWhole) {
+        CKeysOf known;
+        if (kHasName<R>) known.Key("name");
+        CaseFields(known, record);
+        item.Keys(known.m_keys);
+    }
+    CaseFields(get, record);
+    get.Finish();
+    if constexpr (kHasName<R>) item.GetName("name", record.name, taken);
+    if constexpr (kWhole) RecordToSiChecked(item, record, units);
 }
 
-constexpr auto kNoReferences = [](CJsonReader&, const auto&) {};
-
-inline void CheckReference(CJsonReader& in, const char* key, bool exists, const char* what)
+/// check(item, key, record) judges what the list of members leaves open.
+template <class R, class F>
+void ReadTable(CJsonReader& root, const CCaseNames& names, const T_RECORD_ROW<R>& row,
+               T_MODEL& model, std::span<const char* const> more, F check)
 {
-    if (!exists) in.FailAt(key, std::string("there is no such ") + what);
+    T_TABLE<R>& table = model.*row.table;
+    std::set<std::string> taken;
+    const auto read = [&](CJsonReader& item, std::size_t) {
+        R record;
+        ReadRecord(item, names, model.styp.units, row, more, taken, record);
+        int key = table.empty() ? 1 : table.rbegin()->first + 1; // as they count
+        if constexpr (RowOf<R>().key == CASE_KEY::Member) key = record.id;
+        if (row.key == CASE_KEY::Stated) key = ReadKey(item, key - 1);
+        check(item, key, record);
+        if (!table.try_emplace(key, std::move(record)).second && row.key == CASE_KEY::Member)
+            item.FailAt("id", std::string(row.noun) + ' ' + std::to_string(key) + " appears twice");
+    };
+    if (std::is_same_v<R, T_NODE_D>)
+        root.Member(row.member).ForEachItem(read); // a model has nodes
+    else
+        ForEachRecord(root, row.member, read);
 }

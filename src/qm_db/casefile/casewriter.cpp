@@ -1,79 +1,65 @@
 #include "qm_db/casefile/casewriter.h"
 
+#include "qm_db/casefile/caseput.h"
 #include "qm_db/casefile/jsonnames.h"
-#include "qm_db/records/structnames.h"
+
+#include <set>
 
 namespace {
 
-void WriteHead(CJsonWriter& out, const T_STYP_D& styp)
+/// What the case file has beside the members of a record.
+template <class R>
+void WriteMore(CJsonWriter&, const T_MODEL_CONTENT&, int, const R&)
 {
-    out.Member("format", kCaseFormat);
-    if (!styp.title.empty()) out.Member("title", styp.title);
-    out.Key("units");
-    out.BeginObject(true);
-    out.Member("force", NameOf(styp.units.force));
-    out.Member("length", NameOf(styp.units.length));
-    out.EndObject();
-    if (styp.gravity) out.Member("gravity", *styp.gravity, kDimAccel);
-    if (styp.plane) out.Member("plane", kPlaneNames[static_cast<std::size_t>(*styp.plane)]);
+}
+void WriteMore(CJsonWriter& out, const T_MODEL_CONTENT& content, int key, const T_POLC_D& push)
+{
+    const auto it = content.results.find(key);
+    const bool hasSteps = it != content.results.end() && it->second && it->second->StepCount() > 0;
+    if (hasSteps || !push.control) out.Key("steps");
+    if (hasSteps)
+        WriteSteps(out, *it->second, push.direction);
+    else if (!push.control)
+        out.Fail("the load case \"" + push.name +
+                 "\" has no results, which a case file can't leave out");
+    const auto steps = content.model.poverSteps.find(key);
+    if (out.Failed() || steps == content.model.poverSteps.end()) return;
+    CCasePut put(out);
+    put.NeedPart("limit_state_steps", steps->second);
 }
 
-void WriteNodes(CJsonWriter& out, const T_MODEL& model)
+template <class R>
+void WriteName(CJsonWriter& out, const R& record, std::set<std::string>& taken, CASE_KEY key)
 {
-    out.Key("nodes");
-    out.BeginArray();
-    for (const auto& [id, node] : model.nodes) {
-        out.BeginObject(true);
-        out.Member("id", id);
-        out.Member("xyz", node.xyz, kDimLength);
-        out.Member("mass", node.mass, kDimMass);
-        out.Member("restraint", node.restraint);
-        out.EndObject();
-    }
-    out.EndArray();
+    out.Member("name", record.name);
+    if (key != CASE_KEY::Stated) return;
+    if (record.name.empty()) out.Fail("a name can't be empty");
+    if (!taken.insert(record.name).second) out.Fail("the name appears twice");
 }
 
-void WriteStoreys(CJsonWriter& out, const T_MODEL& model)
+template <class R>
+void WriteTable(CJsonWriter& out, const CCaseNames& names, const T_RECORD_ROW<R>& row,
+                const T_MODEL_CONTENT& content)
 {
-    if (model.storeys.empty()) return;
-    out.Key("storeys");
-    out.BeginArray();
-    for (const auto& entry : model.storeys) {
-        const T_STOR_D& storey = entry.second;
-        out.BeginObject();
-        out.Member("name", storey.name);
-        out.Member("height", storey.height, kDimLength);
-        out.Member("nodes", storey.nodes);
-        out.EndObject();
-    }
-    out.EndArray();
-}
-
-void WriteMode(CJsonWriter& out, const T_EIGV_D& mode)
-{
-    out.BeginObject();
-    out.Member("period", mode.period);
-    out.Key("shape");
-    out.BeginObject();
-    for (const auto& [node, values] : mode.shape)
-        out.Member(std::to_string(node), values);
-    out.EndObject();
-    out.MemberIf("participation", mode.participation);
-    out.MemberIf("mass_percent", mode.massPercent);
-    out.EndObject();
-}
-
-void WriteModes(CJsonWriter& out, const T_MODEL& model)
-{
-    if (model.modes.empty()) return;
-    out.Key("modes");
+    const T_TABLE<R>& table = content.model.*row.table;
+    if (!row.member || (table.empty() && !std::is_same_v<R, T_NODE_D>)) return;
+    out.Key(row.member);
     out.BeginArray();
     int next = 1;
-    for (const auto& [number, mode] : model.modes) {
-        WriteMode(out, mode);
-        // The place in the array is the mode number, which load patterns name.
-        if (number != next++)
-            out.Fail("mode numbers must run 1, 2, 3, ...: found " + std::to_string(number));
+    std::set<std::string> taken;
+    for (const auto& [key, record] : table) {
+        if (out.Failed()) return;
+        out.BeginObject(kIsOneLine<R>);
+        if (row.key == CASE_KEY::Stated && key != next) out.Member("key", key);
+        if constexpr (kHasName<R>) WriteName(out, record, taken, row.key);
+        CCasePut put(out, &names);
+        CaseFields(put, record);
+        WriteMore(out, content, key, record);
+        out.EndObject();
+        // The place of a mode in the array is its number, which load patterns name.
+        if (std::is_same_v<R, T_EIGV_D> && key != next)
+            out.Fail("mode numbers must run 1, 2, 3, ...: found " + std::to_string(key));
+        next = key + 1;
     }
     out.EndArray();
 }
@@ -82,15 +68,14 @@ void WriteModes(CJsonWriter& out, const T_MODEL& model)
 
 void WriteCase(CJsonWriter& out, const T_MODEL_CONTENT& content)
 {
+    const CCaseNames names(content.model);
+    CCasePut model(out, &names);
     out.BeginObject();
-    WriteHead(out, content.model.styp);
-    WriteNodes(out, content.model);
-    WriteStoreys(out, content.model);
-    WriteModes(out, content.model);
-    WriteStructTables(out, content.model);
-    WriteHingeTables(out, content.model);
-    WriteSpectra(out, content.model);
-    WritePushovers(out, content);
-    WriteEvaluations(out, content.model);
+    out.Member("format", kCaseFormat);
+    HeadFields(model, content.model.styp);
+    ForEachKind([&]<class R>(const T_RECORD_ROW<R>& row) {
+        if (std::is_same_v<R, T_MATL_D>) OptionFields(model, content.model.styp);
+        WriteTable(out, names, row, content);
+    });
     out.EndObject();
 }

@@ -8,9 +8,5 @@
 /// control, a result that can't be read) is kept by the writer.
 void WriteCase(CJsonWriter& out, const T_MODEL_CONTENT& content);
 
-/// Its parts; each writes one member of the document, or nothing when its table is empty.
-void WriteStructTables(CJsonWriter& out, const T_MODEL& model);
-void WriteHingeTables(CJsonWriter& out, const T_MODEL& model);
-void WriteSpectra(CJsonWriter& out, const T_MODEL& model);
-void WritePushovers(CJsonWriter& out, const T_MODEL_CONTENT& content);
-void WriteEvaluations(CJsonWriter& out, const T_MODEL& model);
+/// "steps" of a load case of that direction (1 to 6).
+void WriteSteps(CJsonWriter& out, IPushResult& result, int direction);

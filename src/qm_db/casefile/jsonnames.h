@@ -1,29 +1,9 @@
-// Names of the case file that stand for numbers, in the order of their numbers.
+// Words of the case file that belong to no record, and dimensions of the steps of load cases.
 #pragma once
 
-#include "qm_db/records.h"
-
-#include <array>
+#include "qm_db/records/evalnames.h"
 
 inline constexpr const char* kCaseFormat = "qm-rps case 1";
-
-inline constexpr std::array<const char*, 7> kForceNames{"N",    "kN",  "MN",  "kgf",
-                                                        "tonf", "lbf", "kips"};
-inline constexpr std::array<const char*, 5> kLengthNames{"mm", "cm", "m", "in", "ft"};
-
-/// In the order of the alternatives of T_SPFC_D::data.
-inline constexpr std::array<const char*, 5> kSpectrumKinds{"atc40", "ec8-2004", "ec8-1994", "ntc",
-                                                           "user"};
-inline constexpr std::array<const char*, 5> kSoils{"A", "B", "C", "D", "E"};
-inline constexpr std::array<const char*, 4> kTopographies{"T1", "T2", "T3", "T4"};
-
-/// In the order of PUSH_METHOD, which starts at Fema440.
-inline constexpr std::array<const char*, 5> kMethodNames{"FEMA440", "ATC-40", "EC8/OPCM", "NTC2008",
-                                                         "NTC2018"};
-inline constexpr int kFirstMethod = static_cast<int>(PUSH_METHOD::Fema440);
-inline constexpr std::array<const char*, 3> kProcedures{"A", "B", "C"};
-inline constexpr std::array<const char*, 3> kBilinearRules{"ec8", "ntc", "masonry"};
-
 inline constexpr const char* kStateBeforePush = "state before push";
 
 /// Dimension of the displacements and of the base reactions of a load case (direction 1 to 6).

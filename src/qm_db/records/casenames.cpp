@@ -1,36 +1,28 @@
 #include "qm_db/records/casenames.h"
 
-namespace {
-
-template <class T>
-const std::string* NameIn(const T_TABLE<T>& table, int key)
+const std::string* CCaseNames::NameOf(RECORD_KIND kind, int key) const
 {
-    const auto it = table.find(key);
-    return it == table.end() ? nullptr : &it->second.name;
+    const std::string* name = nullptr;
+    WithKind(kind, [&]<class R>(const T_RECORD_ROW<R>& row) {
+        if constexpr (kHasName<R>) {
+            const T_TABLE<R>& table = m_model.*row.table;
+            if (const auto it = table.find(key); it != table.end()) name = &it->second.name;
+        }
+    });
+    return name;
 }
 
-} // namespace
-
-const std::string* CCaseNames::NameOf(CASE_REF kind, int key) const
+bool CCaseNames::HasKey(RECORD_KIND kind, int key) const
 {
-    switch (kind) {
-    case CASE_REF::Material:
-        return NameIn(m_model.materials, key);
-    case CASE_REF::Section:
-        return NameIn(m_model.sections, key);
-    case CASE_REF::LoadCase:
-        return NameIn(m_model.loadCases, key);
-    case CASE_REF::Combination:
-        return NameIn(m_model.combinations, key);
-    case CASE_REF::Stage:
-        return NameIn(m_model.stages, key);
-    }
-    return nullptr;
+    bool has = false;
+    WithKind(kind, [&](const auto& row) { has = (m_model.*row.table).contains(key); });
+    return has;
 }
 
-std::optional<int> CCaseNames::KeyOf(CASE_REF kind, const std::string& name) const
+std::optional<int> CCaseNames::KeyOf(RECORD_KIND kind, const std::string& name) const
 {
-    const T_KEYS& keys = m_keys[static_cast<std::size_t>(kind)];
-    const auto it = keys.find(name);
-    return it == keys.end() ? std::nullopt : std::optional(it->second);
+    const auto keys = m_keys.find(kind);
+    if (keys == m_keys.end()) return std::nullopt;
+    const auto it = keys->second.find(name);
+    return it == keys->second.end() ? std::nullopt : std::optional(it->second);
 }

@@ -1,4 +1,4 @@
-// Members of the records of hinges and of pushover load cases; see structfields.h.
+// Members of the records of hinges; see fieldwords.h.
 #pragma once
 
 #include "qm_db/records/hingenames.h"
@@ -15,8 +15,7 @@ struct T_CURVE_DIMS {
     }
 };
 
-// ---- curves
-// ---------------------------------------------------------------------------------------
+// ---- curves -------------------------------------------------------------------------------------
 
 template <class V, class T, class... C>
 void CaseFields(V& v, const T_SIDES<T>& r, const C&... context)
@@ -285,8 +284,8 @@ void CaseFields(V& v, T_FIELD_REF<V, T_PHGT_D> r)
     v.EnumOpt("definition", r.definition, d.definition, kDefinitionNames, "definition");
     v.EnumOpt("interaction", r.interaction, d.interaction, kInteractionNames, "interaction");
     v.EnumOpt("material", r.material, d.material, kMatlNames, "material type");
-    v.Opt("section", r.section, 0);
-    v.Opt("section_material", r.sectionMaterial, 0);
+    v.OptKeyRef("section", r.section, KindOf<T_SECT_D>());
+    v.OptKeyRef("section_material", r.sectionMaterial, KindOf<T_MATL_D>());
     v.Opt("fibre_section", r.fibreSection, 0);
     v.Opt("thickness_section", r.thicknessSection, 0);
     v.Part("components", r.components, r.definition);
@@ -309,8 +308,8 @@ void CaseFields(V& v, T_FIELD_REF<V, T_HINGE_STRENGTHS> r)
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_PHGE_D> r)
 {
-    v.Need("element", r.element);
-    v.Need("hinge_type", r.hingeType);
+    v.KeyRef("element", r.element, KindOf<T_ELEM_D>());
+    v.KeyRef("hinge_type", r.hingeType, KindOf<T_PHGT_D>());
     v.Part("crack", r.crack);
     v.Part("yield", r.yield);
 }
@@ -328,55 +327,4 @@ void CaseFields(V& v, T_FIELD_REF<V, T_POFC_D> r)
 {
     v.Need("step", r.step);
     v.Need("factor", r.factor);
-}
-
-// ---- pushover load cases ------------------------------------------------------------------------
-
-template <class V>
-void CaseFields(V& v, T_FIELD_REF<V, T_POLC_PATTERN> r)
-{
-    v.Enum("kind", r.kind, kPatternNames, "pattern");
-    v.Need("number", r.number);
-    v.Opt("factor", r.factor, 1.0);
-}
-
-template <class V>
-void CaseFields(V& v, T_FIELD_REF<V, T_POLC_CONTROL> r)
-{
-    static const T_POLC_CONTROL d;
-    v.Code("increment_method", r.incrementMethod, kIncrementNames, "increment method");
-    v.Opt("increment_option", r.incrementOption, d.incrementOption);
-    v.Opt("increment_function", r.incrementFunction, d.incrementFunction);
-    v.Opt("stiffness_ratio_limit", r.stiffnessRatioLimit, d.stiffnessRatioLimit);
-    v.Opt("generate_static_angle", r.generateStaticAngle, d.generateStaticAngle);
-    v.Opt("static_angle", r.staticAngle, d.staticAngle);
-    v.Opt("master_node_control", r.masterNodeControl, d.masterNodeControl);
-    v.Opt("master_max_displ", r.masterMaxDispl, d.masterMaxDispl, kDimLength);
-    v.Opt("max_trans_displ", r.maxTransDispl, d.maxTransDispl, kDimLength);
-}
-
-/// Only what the database keeps as text; the case file has the other members too.
-template <class V>
-void CaseFields(V& v, T_FIELD_REF<V, T_POLC_D> r)
-{
-    v.List("patterns", r.patterns);
-    v.PartIf("control", r.control);
-}
-
-// ---- options of the model -----------------------------------------------------------------------
-
-template <class V>
-void CaseFields(V& v, T_FIELD_REF<V, T_DESIGN_CODES> r)
-{
-    v.OptIf("concrete", r.concrete);
-    v.OptIf("steel", r.steel);
-}
-
-/// The options stand in the record of the whole model.
-template <class V>
-void HingeOptionFields(V& v, T_FIELD_REF<V, T_STYP_D> r)
-{
-    v.Opt("alternative_hysteresis", r.alternativeHysteresis, false);
-    v.Opt("wall_strength_degradation", r.wallStrengthDegradation, false);
-    v.Opt("gsd", r.gsd, false);
 }

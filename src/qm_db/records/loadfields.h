@@ -1,4 +1,4 @@
-// Members of the records of load cases, combinations and unknown load factors; see structfields.h.
+// Members of the records of load cases, combinations and unknown load factors; see fieldwords.h.
 #pragma once
 
 #include "qm_db/records/structfields.h"
@@ -87,9 +87,9 @@ void CaseFields(V& v, T_FIELD_REF<V, T_LCOM_ITEM> r)
 {
     if constexpr (V::kReads) r.combination = v.Has("combination");
     if (r.combination)
-        v.NeedRef("combination", r.key, CASE_REF::Combination);
+        v.NeedRef("combination", r.key, KindOf<T_LCOM_D>());
     else
-        v.NeedRef("case", r.key, CASE_REF::LoadCase);
+        v.NeedRef("case", r.key, KindOf<T_STLD_D>());
     v.Need("factor", r.factor);
 }
 
@@ -145,7 +145,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_ULFC_D> r)
     if constexpr (V::kWrites) {
         if (r.inequality && !r.upper && !r.lower) return v.Fail("the constraint has no bound");
     }
-    v.OptRef("stage", r.stage, CASE_REF::Stage);
+    v.OptRef("stage", r.stage, KindOf<T_STAG_D>());
     v.StageStep("step", r.step, kStageLastStep);
     v.Check("step", r.stage != 0, "a step needs a stage");
     const T_DIM dim = UlfcDim(r.type, r.component);
@@ -162,17 +162,17 @@ void CaseFields(V& v, T_FIELD_REF<V, T_ULFC_D> r)
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_ULFI_UNKNOWN> r)
 {
-    v.NeedRef("case", r.loadCase, CASE_REF::LoadCase);
+    v.NeedRef("case", r.loadCase, KindOf<T_STLD_D>());
     v.Opt("weight", r.weight, 1.0);
 }
 
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_ULFI_D> r)
 {
-    v.NeedRef("combination", r.combination, CASE_REF::Combination);
+    v.NeedRef("combination", r.combination, KindOf<T_LCOM_D>());
     v.Enum("objective", r.objective, kObjectiveNames, "objective");
     v.EnumOpt("sign", r.sign, 1, kSignNames, "sign");
     v.Opt("solve_by_equations", r.solveByEquations, false);
     v.List("unknown", r.unknowns);
-    v.Texts("constraints", r.constraints);
+    v.NameRefs("constraints", r.constraints, KindOf<T_ULFC_D>());
 }

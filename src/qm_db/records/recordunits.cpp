@@ -1,51 +1,30 @@
 #include "qm_db/records/recordunits.h"
 
-#include "qm_db/records/casequantities.h"
+#include "qm_db/records/hingefields.h"
+#include "qm_db/records/pushfields.h"
+#include "qm_db/records/stagefields.h"
 
 namespace {
 
-template <class R>
-void Visit(R& r, const QuantityFn& f)
-{
-    CCaseQuantities<QuantityFn> quantities(f);
-    CaseFields(quantities, r);
-}
+class CQuantities : public CFieldLook<CQuantities> {
+public:
+    template <class T>
+    using Ref = T&;
+    explicit CQuantities(const QuantityFn& f) : m_f(f) {}
+
+    void Number(double& value, T_DIM dim)
+    {
+        if (dim != kDimNone) m_f(value, dim);
+    }
+
+private:
+    const QuantityFn& m_f;
+};
 
 } // namespace
 
-void ForEachQuantity(T_MATL_D& r, const QuantityFn& f)
+void ForEachQuantity(T_RECORD_POINTER record, const QuantityFn& f)
 {
-    Visit(r, f);
-}
-void ForEachQuantity(T_SECT_D& r, const QuantityFn& f)
-{
-    Visit(r, f);
-}
-void ForEachQuantity(T_PHGT_D& r, const QuantityFn& f)
-{
-    Visit(r, f);
-}
-void ForEachQuantity(T_PHGE_D& r, const QuantityFn& f)
-{
-    Visit(r, f);
-}
-void ForEachQuantity(T_IEHP_D& r, const QuantityFn& f)
-{
-    Visit(r, f);
-}
-void ForEachQuantity(T_POLC_D& r, const QuantityFn& f)
-{
-    Visit(r, f);
-}
-void ForEachQuantity(T_ELEM_D& r, const QuantityFn& f)
-{
-    Visit(r, f);
-}
-void ForEachQuantity(T_STLD_D& r, const QuantityFn& f)
-{
-    Visit(r, f);
-}
-void ForEachQuantity(T_ULFC_D& r, const QuantityFn& f)
-{
-    Visit(r, f);
+    CQuantities quantities(f);
+    std::visit([&](auto* r) { CaseFields(quantities, *r); }, record);
 }

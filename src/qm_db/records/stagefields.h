@@ -1,4 +1,4 @@
-// Members of the records of construction stages; see structfields.h.
+// Members of the records of construction stages; see fieldwords.h.
 #pragma once
 
 #include "qm_db/records/loadfields.h"
@@ -6,7 +6,7 @@
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_STAG_LOAD> r)
 {
-    v.NeedRef("case", r.loadCase, CASE_REF::LoadCase);
+    v.NeedRef("case", r.loadCase, KindOf<T_STLD_D>());
     v.StageStep("step", r.step, kStageFirstStep);
 }
 
@@ -29,22 +29,14 @@ void CaseFields(V& v, T_FIELD_REF<V, T_STAG_D> r)
     v.Check("duration", r.duration >= 0.0, kNotNegative);
 }
 
-template <class V>
-void CaseFields(V& v, T_FIELD_REF<V, T_STCT_D> r)
-{
-    v.EnumOpt("birth", r.birth, STAGE_BIRTH::OnDeformed, kStageBirthNames, "birth of elements");
-    v.Opt("geometric_stiffness", r.geometricStiffness, false);
-    v.Opt("cable_sag", r.cableSag, false);
-}
-
 /// What a row has follows from the list that it stands in.
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_ULSI_ROW> r, bool unknown)
 {
     if constexpr (V::kReads) r.unknown = unknown;
-    v.NeedRef("stage", r.stage, CASE_REF::Stage);
+    v.NeedRef("stage", r.stage, KindOf<T_STAG_D>());
     v.StageStep("step", r.step, kStageFirstStep);
-    v.NeedRef("case", r.loadCase, CASE_REF::LoadCase);
+    v.NeedRef("case", r.loadCase, KindOf<T_STLD_D>());
     if (unknown) {
         v.Opt("weight", r.weight, 1.0);
         v.Opt("pretension", r.pretension, false);
@@ -70,5 +62,5 @@ void CaseFields(V& v, T_FIELD_REF<V, T_ULSI_D> r)
         unknown.insert(unknown.end(), known.begin(), known.end());
         r.rows = std::move(unknown);
     }
-    v.Texts("constraints", r.constraints);
+    v.NameRefs("constraints", r.constraints, KindOf<T_ULFC_D>());
 }

@@ -1,24 +1,7 @@
-// Members of the records of the structure: each is listed once, with its key in the case file and
-// its dimension, for reading (CCaseGet), writing (CCasePut) and for the list of quantities
-// (CCaseQuantities). Names of records stand outside. loadfields.h and hingefields.h go on.
-//
-// Need: a member that must be there. Opt: left out when it has the given default; OptOr: with an
-// older key that is still read. Enum, EnumOpt: a name out of a list. Code: the same, other numbers
-// stay numbers. Part: a nested record, left out when it has nothing to say. NeedFixed, OptFixed:
-// exactly so many numbers, each with its dimension. Flags: the names of the flags that are set.
-// NeedRef, OptRef: another record, by name in a case file and by key in the model file. Node,
-// Element: ids that must be there. Check: a rule of the case file for a member. PartIf, List,
-// Padded, Pairs, Texts: as their types say.
+// Members of the records of the structure; see fieldwords.h. loadfields.h and hingefields.h go on.
 #pragma once
 
-#include "qm_db/records.h"
-#include "qm_db/records/casenames.h"
-#include "qm_db/records/hingenames.h"
-#include "qm_db/records/structnames.h"
-
-/// T& for a visitor that reads or converts, const T& for one that writes.
-template <class V, class T>
-using T_FIELD_REF = typename V::template Ref<T>;
+#include "qm_db/records/fieldwords.h"
 
 inline constexpr T_DIM kDimArea{0, 2};
 inline constexpr T_DIM kDimModulus{0, 3};
@@ -31,15 +14,102 @@ using T_DIMS3 = std::array<T_DIM, 3>;
 using T_DIMS6 = std::array<T_DIM, 6>; // of X, Y, Z, RX, RY, RZ
 inline constexpr T_DIMS3 kRatios3{};
 inline constexpr T_DIMS3 kLengths3{kDimLength, kDimLength, kDimLength};
+inline constexpr T_DIMS3 kMasses3{kDimMass, kDimMass, kDimMass};
 inline constexpr T_DIMS6 kDofLengths{kDimLength, kDimLength, kDimLength};
 inline constexpr T_DIMS6 kDofForces{kDimForce,  kDimForce,  kDimForce,
                                     kDimMoment, kDimMoment, kDimMoment};
 inline constexpr T_DIMS6 kDofSprings{kDimSpring, kDimSpring, kDimSpring,
                                      kDimMoment, kDimMoment, kDimMoment};
 
-// ---- materials and sections ---------------------------------------------------------------------
-
 inline constexpr const char* kNotNegative = "the value can't be negative";
+
+// ---- options of the model -----------------------------------------------------------------------
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_DESIGN_CODES> r)
+{
+    v.OptIf("concrete", r.concrete);
+    v.OptIf("steel", r.steel);
+}
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_STCT_D> r)
+{
+    v.EnumOpt("birth", r.birth, STAGE_BIRTH::OnDeformed, kStageBirthNames, "birth of elements");
+    v.Opt("geometric_stiffness", r.geometricStiffness, false);
+    v.Opt("cable_sag", r.cableSag, false);
+}
+
+/// What a case file begins with.
+template <class V>
+void HeadFields(V& v, T_FIELD_REF<V, T_STYP_D> r)
+{
+    v.Opt("title", r.title, {});
+    v.Group("units", [&](auto& units) {
+        units.Enum("force", r.units.force, kForceNames, "unit");
+        units.Enum("length", r.units.length, kLengthNames, "unit");
+    });
+    v.OptIf("gravity", r.gravity, kDimAccel);
+    v.Check("gravity", r.gravity.value_or(1.0) > 0.0, "gravity must be above 0");
+    v.EnumIf("plane", r.plane, kPlaneNames, "plane");
+}
+
+template <class V>
+void OptionFields(V& v, T_FIELD_REF<V, T_STYP_D> r)
+{
+    v.Group("design_codes", [&](auto& codes) { CaseFields(codes, r.designCodes); });
+    v.Group("stage_control", [&](auto& control) { CaseFields(control, r.stageControl); });
+    v.Group("hinge_options", [&](auto& options) {
+        options.Opt("alternative_hysteresis", r.alternativeHysteresis, false);
+        options.Opt("wall_strength_degradation", r.wallStrengthDegradation, false);
+        options.Opt("gsd", r.gsd, false);
+    });
+}
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_STYP_D> r)
+{
+    HeadFields(v, r);
+    OptionFields(v, r);
+}
+
+// ---- nodes, storeys, modes ----------------------------------------------------------------------
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_NODE_D> r)
+{
+    v.Need("id", r.id);
+    v.Check("id", r.id > 0, "a node id must be above 0");
+    v.NeedFixed("xyz", r.xyz, kLengths3);
+    v.StateFixed("mass", r.mass, kMasses3);
+    v.CheckEach(
+        "mass", r.mass, [](double m) { return m >= 0.0; }, "a mass can't be negative");
+    v.State("restraint", r.restraint);
+    v.CheckEach(
+        "restraint", r.restraint, [](int flag) { return flag == 0 || flag == 1; },
+        "a restraint is 0 or 1");
+}
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_STOR_D> r)
+{
+    v.Need("height", r.height, kDimLength);
+    v.Check("height", r.height > 0.0, "a storey height must be above 0");
+    v.NodeList("nodes", r.nodes);
+}
+
+/// Mode shapes are in the normalisation of their source: no member is a quantity.
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_EIGV_D> r)
+{
+    v.Need("period", r.period);
+    v.Check("period", r.period > 0.0, "a period must be above 0");
+    v.NodeTable("shape", r.shape);
+    v.OptIf("participation", r.participation);
+    v.OptIf("mass_percent", r.massPercent);
+}
+
+// ---- materials and sections ---------------------------------------------------------------------
 
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_MATL_D> r)
@@ -124,22 +194,16 @@ void CaseFields(V& v, T_FIELD_REF<V, T_ELEM_D> r)
 {
     v.Need("id", r.id);
     v.EnumOpt("kind", r.kind, ELEM_KIND::Beam, kElemKindNames, "kind");
-    std::vector<int> nodes{r.nodeI};
-    if (r.kind != ELEM_KIND::Spring) nodes.push_back(r.nodeJ);
-    v.NodeList("nodes", nodes);
-    v.Rule("nodes", nodes.size() == (r.kind == ELEM_KIND::Spring ? 1U : 2U),
-           r.kind == ELEM_KIND::Spring ? "a spring has one node" : "an element has two nodes");
-    if constexpr (V::kReads) {
-        r.nodeI = nodes.empty() ? 0 : nodes.front();
-        r.nodeJ = nodes.size() < 2 ? 0 : nodes[1];
-    }
-    if (r.kind == ELEM_KIND::Link || r.kind == ELEM_KIND::Spring) {
+    const bool spring = r.kind == ELEM_KIND::Spring;
+    v.NodePair("nodes", r.nodeI, r.nodeJ, spring ? 1 : 2,
+               spring ? "a spring has one node" : "an element has two nodes");
+    if (spring || r.kind == ELEM_KIND::Link) {
         v.NeedFixed("stiffness", r.stiffness, kDofSprings);
         v.CheckEach(
             "stiffness", r.stiffness, [](double k) { return k >= 0.0; }, kNotNegative);
     } else {
-        v.OptRef("material", r.material, CASE_REF::Material);
-        v.OptRef("section", r.section, CASE_REF::Section);
+        v.OptRef("material", r.material, KindOf<T_MATL_D>());
+        v.OptRef("section", r.section, KindOf<T_SECT_D>());
         v.OptFixed("z_axis", r.zAxis, {}, kRatios3);
     }
     if (r.kind == ELEM_KIND::Beam) {

@@ -1,36 +1,17 @@
 #include "qm_db/records/units.h"
 
+#include "qm_db/records/evalnames.h"
+
 #include <charconv>
 #include <cstddef>
 
 namespace {
 
-struct T_UNIT_ROW {
-    std::string_view name;
-    double si; // SI value of one unit
-};
-
-// Rows in the order of FORCE_UNIT; NIST SP 811 appendix B (exact where exact there).
-constexpr std::array<T_UNIT_ROW, 7> kForce{{{"N", 1.0},
-                                            {"kN", 1e3},
-                                            {"MN", 1e6},
-                                            {"kgf", 9.80665},
-                                            {"tonf", 9806.65},
-                                            {"lbf", 4.4482216152605},
-                                            {"kips", 4448.2216152605}}};
-
-// Rows in the order of LENGTH_UNIT.
-constexpr std::array<T_UNIT_ROW, 5> kLength{
-    {{"mm", 1e-3}, {"cm", 1e-2}, {"m", 1.0}, {"in", 0.0254}, {"ft", 0.3048}}};
-
-template <class E, std::size_t N>
-std::optional<E> FromName(const std::array<T_UNIT_ROW, N>& rows, std::string_view name)
-{
-    for (std::size_t i = 0; i < N; ++i) {
-        if (rows[i].name == name) return static_cast<E>(i);
-    }
-    return std::nullopt;
-}
+// SI values of one unit, in the order of FORCE_UNIT and LENGTH_UNIT; NIST SP 811 appendix B (exact
+// where exact there).
+constexpr std::array<double, kForceNames.size()> kForce{
+    1.0, 1e3, 1e6, 9.80665, 9806.65, 4.4482216152605, 4448.2216152605};
+constexpr std::array<double, kLengthNames.size()> kLength{1e-3, 1e-2, 1.0, 0.0254, 0.3048};
 
 double Power(double base, int exponent)
 {
@@ -42,31 +23,21 @@ double Power(double base, int exponent)
 
 } // namespace
 
-std::optional<FORCE_UNIT> ForceUnitFromName(std::string_view name)
-{
-    return FromName<FORCE_UNIT>(kForce, name);
-}
-
-std::optional<LENGTH_UNIT> LengthUnitFromName(std::string_view name)
-{
-    return FromName<LENGTH_UNIT>(kLength, name);
-}
-
 std::string_view NameOf(FORCE_UNIT unit)
 {
-    return kForce[static_cast<std::size_t>(unit)].name;
+    return kForceNames[static_cast<std::size_t>(unit)];
 }
 std::string_view NameOf(LENGTH_UNIT unit)
 {
-    return kLength[static_cast<std::size_t>(unit)].name;
+    return kLengthNames[static_cast<std::size_t>(unit)];
 }
 double NewtonsPer(FORCE_UNIT unit)
 {
-    return kForce[static_cast<std::size_t>(unit)].si;
+    return kForce[static_cast<std::size_t>(unit)];
 }
 double MetresPer(LENGTH_UNIT unit)
 {
-    return kLength[static_cast<std::size_t>(unit)].si;
+    return kLength[static_cast<std::size_t>(unit)];
 }
 
 double SiFactor(const T_UNITS& units, T_DIM dim)

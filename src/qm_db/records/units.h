@@ -30,9 +30,7 @@ struct T_UNITS {
     bool operator==(const T_UNITS&) const = default;
 };
 
-/// "kN" or "in"; exact spelling. nullopt for an unknown name.
-std::optional<FORCE_UNIT> ForceUnitFromName(std::string_view name);
-std::optional<LENGTH_UNIT> LengthUnitFromName(std::string_view name);
+/// "kN" or "in".
 std::string_view NameOf(FORCE_UNIT unit);
 std::string_view NameOf(LENGTH_UNIT unit);
 

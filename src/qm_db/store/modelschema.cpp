@@ -118,6 +118,50 @@ constexpr const char* kTables[] = {
 
     kMaterials, kSections, kHingeTypes, kInelasticHinges, kIncrementFunctions};
 
+constexpr T_MEMBER_PLACE kMemberPlaces[] = {
+    {"model", "force", MEMBER_PLACE::Column, "force_unit"},
+    {"model", "length", MEMBER_PLACE::Column, "length_unit"},
+    {"model", "concrete", MEMBER_PLACE::Column, "concrete_code"},
+    {"model", "steel", MEMBER_PLACE::Column, "steel_code"},
+    {"nodes", "id", MEMBER_PLACE::Packed, "id"},
+    {"nodes", "xyz", MEMBER_PLACE::Packed, "xyz"},
+    {"nodes", "mass", MEMBER_PLACE::Packed, "mass"},
+    {"nodes", "restraint", MEMBER_PLACE::Packed, "restraint"},
+    {"storeys", "nodes", MEMBER_PLACE::List, "nodes"},
+    {"modes", "shape", MEMBER_PLACE::List, "shape"},
+    {"modes", "participation", MEMBER_PLACE::List, "participation"},
+    {"modes", "mass_percent", MEMBER_PLACE::List, "mass_percent"},
+    {"elements", "id", MEMBER_PLACE::Packed, "data"},
+    {"elements", "nodes", MEMBER_PLACE::Packed, "data"},
+    {"elements", "section", MEMBER_PLACE::Packed, "data"},
+    {"elements", "material", MEMBER_PLACE::Packed, "data"},
+    {"elements", "member", MEMBER_PLACE::Packed, "data"},
+    {"elements", "kind", MEMBER_PLACE::Packed, "kind"},
+    {"elements", "release", MEMBER_PLACE::Packed, "release"},
+    {"elements", "z_axis", MEMBER_PLACE::Packed, "z_axis"},
+    {"elements", "offset", MEMBER_PLACE::Packed, "offset"},
+    {"elements", "stiffness", MEMBER_PLACE::Packed, "stiffness"},
+    {"hinges", "element", MEMBER_PLACE::Packed, "refs"},
+    {"hinges", "hinge_type", MEMBER_PLACE::Packed, "refs"},
+    {"hinges", "crack", MEMBER_PLACE::Packed, "crack"},
+    {"hinges", "yield", MEMBER_PLACE::Packed, "yield"},
+    {"increment_functions", "step", MEMBER_PLACE::List, "step"},
+    {"increment_functions", "factor", MEMBER_PLACE::List, "factor"},
+    {"spectra", "SLO", MEMBER_PLACE::Part, "SLO"},
+    {"spectra", "SLD", MEMBER_PLACE::Part, "SLD"},
+    {"spectra", "SLV", MEMBER_PLACE::Part, "SLV"},
+    {"spectra", "SLC", MEMBER_PLACE::Part, "SLC"},
+    {"spectra", "TC*", MEMBER_PLACE::Column, "TCstar"},
+    {"spectra", "T", MEMBER_PLACE::List, "T"},
+    {"spectra", "Sa", MEMBER_PLACE::List, "Sa"},
+    {"pushovers", "pattern", MEMBER_PLACE::Part, "pattern"},
+    {"pushovers", "modes", MEMBER_PLACE::List, "modes"},
+    {"limit_state_steps", "EC8", MEMBER_PLACE::List, "ec8"},
+    {"limit_state_steps", "NTC", MEMBER_PLACE::List, "ntc"},
+    {"evaluations", "user_damping", MEMBER_PLACE::List, "user_damping"},
+    {"evaluations", "bilinear", MEMBER_PLACE::Part, "bilinear"},
+};
+
 /// Version 1 had no hinges and no load cases that are still to be run.
 void MigrateFrom1(const CSqliteDb& db)
 {
@@ -157,6 +201,11 @@ std::vector<std::string> AllTables()
 }
 
 } // namespace
+
+std::span<const T_MEMBER_PLACE> MemberPlaces()
+{
+    return kMemberPlaces;
+}
 
 const T_SCHEMA& CurrentSchema()
 {

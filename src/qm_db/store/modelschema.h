@@ -5,6 +5,7 @@
 #include <cstdint>
 #include <span>
 #include <string>
+#include <string_view>
 
 class CSqliteDb;
 
@@ -48,6 +49,20 @@ inline constexpr std::array<const char*, 24> kModelTables{"model",
                                                           "stages",
                                                           "ulf_stage_items",
                                                           "staged_results"};
+
+/// Where a member of a record stands: in a column of another name; as a list in "arrays"; packed
+/// with those of all records; as a part whose members have the columns name_member, with has_name
+/// where nothing else tells whether it is there.
+enum class MEMBER_PLACE { Column, List, Packed, Part };
+struct T_MEMBER_PLACE {
+    std::string_view table, member; // as in the case file
+    MEMBER_PLACE place;
+    const char* name;
+};
+/// Members that are not here stand in the column of their name where there is one, else in the text
+/// of the record: an object of a case file, in SI.
+std::span<const T_MEMBER_PLACE> MemberPlaces();
+
 inline constexpr const char* kBlockTable = "result_blocks";
 inline constexpr const char* kSumTable = "checksums";
 

@@ -46,6 +46,7 @@ std::string Place(const std::string& owner, std::int64_t key, const std::string&
 
 std::int64_t WidthOf(char kind)
 {
+    if (kind == 't') return 1;
     return kind == 'f' ? 8 : 4;
 }
 
@@ -65,6 +66,12 @@ void CPackedArrays::Put(const std::string& owner, std::int64_t key, const char* 
                         std::span<const int> values)
 {
     m_arrays[{owner, key, name}] = {'i', Pack(values)};
+}
+
+void CPackedArrays::Put(const std::string& owner, std::int64_t key, const char* name,
+                        std::string_view text)
+{
+    m_arrays[{owner, key, name}] = {'t', Pack(std::span<const char>(text))};
 }
 
 bool CPackedArrays::Has(const std::string& owner, std::int64_t key, const char* name) const
@@ -93,6 +100,24 @@ std::vector<int> CPackedArrays::Ints(const std::string& owner, std::int64_t key,
     return Unpack<int>(Bytes(owner, key, name, 'i'));
 }
 
+std::string CPackedArrays::Text(const std::string& owner, std::int64_t key, const char* name) const
+{
+    const auto bytes = Bytes(owner, key, name, 't');
+    std::string text(bytes.size(), '\0');
+    if (!text.empty()) std::memcpy(text.data(), bytes.data(), bytes.size());
+    return text;
+}
+
+std::vector<std::int64_t> CPackedArrays::Keys(const std::string& owner) const
+{
+    std::vector<std::int64_t> keys;
+    for (auto it = m_arrays.lower_bound({owner, std::numeric_limits<std::int64_t>::min(), {}});
+         it != m_arrays.end() && std::get<0>(it->first) == owner; ++it)
+        if (keys.empty() || keys.back() != std::get<1>(it->first))
+            keys.push_back(std::get<1>(it->first));
+    return keys;
+}
+
 void CPackedArrays::Write(const CSqliteDb& db) const
 {
     CSqliteStmt insert(db, "INSERT INTO arrays(owner, key, name, kind, count, width, byte_order, "
@@ -113,13 +138,13 @@ void CPackedArrays::Write(const CSqliteDb& db) const
 
 CPackedArrays::T_PACKED CPackedArrays::CheckedRow(const CSqliteStmt& row)
 {
-    const char kind = row.Text(3) == "f" ? 'f' : 'i';
+    const char kind = row.Text(3) == "f" ? 'f' : row.Text(3) == "t" ? 't' : 'i';
     const std::span<const std::byte> bytes = row.Blob(7);
     const auto size = static_cast<std::int64_t>(bytes.size());
     const std::int64_t width = WidthOf(kind);
     const bool right = row.Text(3) == std::string_view(&kind, 1) && row.Int(5) == width &&
                        size % width == 0 && size / width == row.Int(4) && row.Text(6) == "little" &&
-                       (kind == 'i' || AllFinite(bytes));
+                       (kind != 'f' || AllFinite(bytes));
     if (!right) ThrowDamaged(Place(std::string(row.Text(0)), row.Int(1), std::string(row.Text(2))));
     return {kind, {bytes.begin(), bytes.end()}};
 }

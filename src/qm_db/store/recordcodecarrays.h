@@ -1,4 +1,4 @@
-// The packed lists of numbers of the model: rows of the table "arrays".
+// The packed lists of numbers of the model, and texts: rows of the table "arrays".
 #pragma once
 
 #include <cstddef>
@@ -7,6 +7,7 @@
 #include <map>
 #include <span>
 #include <string>
+#include <string_view>
 #include <tuple>
 #include <vector>
 
@@ -23,10 +24,15 @@ public:
     void Put(const std::string& owner, std::int64_t key, const char* name,
              std::span<const int> values);
 
+    void Put(const std::string& owner, std::int64_t key, const char* name, std::string_view text);
+
     bool Has(const std::string& owner, std::int64_t key, const char* name) const;
     /// Empty when there is none. Throws "damaged" when it holds another kind of number.
     std::vector<double> Doubles(const std::string& owner, std::int64_t key, const char* name) const;
     std::vector<int> Ints(const std::string& owner, std::int64_t key, const char* name) const;
+    std::string Text(const std::string& owner, std::int64_t key, const char* name) const;
+    /// Keys of the owner's arrays, ascending.
+    std::vector<std::int64_t> Keys(const std::string& owner) const;
     /// The packed numbers themselves; the view lives as long as this object.
     std::span<const std::byte> Bytes(const std::string& owner, std::int64_t key, const char* name,
                                      char kind) const;
@@ -41,7 +47,7 @@ public:
 
 private:
     struct T_PACKED {
-        char kind = 'f'; // 'f' or 'i'
+        char kind = 'f'; // 'f', 'i' or 't'
         std::vector<std::byte> bytes;
     };
     static T_PACKED CheckedRow(const CSqliteStmt& row);

@@ -1,4 +1,4 @@
-#include "qm_db/store/recordcodecelements.h"
+#include "qm_db/store/recordcodecpacked.h"
 
 #include "qm_db/file/storefault.h"
 

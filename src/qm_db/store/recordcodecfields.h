@@ -1,255 +1,240 @@
-// Visitors that carry the fields of a record into a row and its arrays, and back.
+// The two visitors of recordwords.h.
 #pragma once
 
-#include "qm_db/file/storefault.h"
-#include "qm_db/records.h"
-#include "qm_db/store/recordbody.h"
+#include "qm_db/casefile/caseget.h"
+#include "qm_db/casefile/caseput.h"
 #include "qm_db/store/recordcodecarrays.h"
 #include "qm_db/store/recordcodecrow.h"
+#include "qm_db/store/recordwords.h"
 
-#include <limits>
-
-/// Names of the spectrum kinds in the order of T_SPFC_D's alternatives.
-inline constexpr std::array<const char*, 5> kSpectrumKinds{"atc40", "ec8-2004", "ec8-1994", "ntc",
-                                                           "user"};
-
-class CFieldPut {
+class CRowPut : public CRowWords<CRowPut> {
 public:
     template <class T>
     using Ref = const T&;
-    CFieldPut(CRecordRow& row, CPackedArrays& arrays) : m_row(row), m_arrays(arrays) {}
+    static constexpr bool kReads = false;
+    static constexpr bool kWrites = true;
 
-    void operator()(const std::string& column, int value)
+    CRowPut(CRecordRow& row, CPackedArrays& arrays, const CTablePlaces& where)
+        : places(where), m_row(row), m_arrays(arrays)
     {
-        m_row.Put(column, std::int64_t{value});
+        m_text.BeginObject(true);
     }
-    void operator()(const std::string& column, bool value) { (*this)(column, value ? 1 : 0); }
-    void operator()(const std::string& column, double value) { m_row.Put(column, value); }
-    void operator()(const std::string& column, char value)
-    {
-        m_row.Put(column, std::string(1, value));
-    }
-    void operator()(const std::string& column, const std::string& value)
-    {
-        m_row.Put(column, value);
-    }
-    void operator()(const std::string& column, FORCE_UNIT value)
-    {
-        m_row.Put(column, std::string(NameOf(value)));
-    }
-    void operator()(const std::string& column, LENGTH_UNIT value)
-    {
-        m_row.Put(column, std::string(NameOf(value)));
-    }
-    void operator()(const std::string& column, PUSH_METHOD value)
-    {
-        (*this)(column, static_cast<int>(value));
-    }
-    void operator()(const std::string& column, MODEL_PLANE value)
-    {
-        (*this)(column, static_cast<int>(value));
-    }
-    template <class T>
-    void operator()(const std::string& column, const std::optional<T>& value)
-    {
-        if (value) (*this)(column, *value);
-    }
+    /// The text of the members that have no place of their own; the row has it where it can.
+    void Finish();
 
-    CRecordRow& Row() const { return m_row; }
-    CPackedArrays& Arrays() const { return m_arrays; }
-    /// Whether an optional part without a required column of its own is there, as 0 or 1.
+    CCasePut& Body() { return m_body; }
+    void Fail(const std::string& reason) { m_text.Fail(reason); }
+
     template <class T>
-    void Flag(const std::string& column, const std::optional<T>& part)
+    bool Cell(const char* key, const T& value)
     {
-        (*this)(column, part.has_value());
+        if (places.Find(key, MEMBER_PLACE::Packed)) return true;
+        if (const char* const list = places.Find(key, MEMBER_PLACE::List)) {
+            if constexpr (requires { PutList(list, value); }) return PutList(list, value), true;
+        }
+        const std::string column = ColumnOf(key);
+        if constexpr (requires { Put(column, value); }) {
+            if (!column.empty()) return Put(column, value), true;
+        }
+        return false;
     }
-    /// True when the optional part is there; `column` is the one that tells.
-    template <class T>
-    bool Part(const std::string&, const std::optional<T>& part) const
+    template <int kFirst, class E>
+    bool CellOf(const char* key, const E& value, std::span<const char* const> names)
     {
+        const std::string column = ColumnOf(key);
+        if (column.empty()) return places.Find(key, MEMBER_PLACE::Packed) != nullptr;
+        const int code = static_cast<int>(value);
+        if (places.IsText(column))
+            m_row.Put(column, std::string(names[static_cast<std::size_t>(code - kFirst)]));
+        else
+            Put(column, code);
+        return true;
+    }
+    template <int kFirst, class E>
+    bool CellOf(const char* key, const std::optional<E>& value, std::span<const char* const> names)
+    {
+        return value ? CellOf<kFirst>(key, *value, names) : !ColumnOf(key).empty();
+    }
+    template <class... T>
+    void Variant(const char* key, const std::variant<T...>& value,
+                 std::span<const char* const> names, const char* what)
+    {
+        const std::string column = ColumnOf(key);
+        if (column.empty()) return m_body.Variant(key, value, names, what);
+        m_row.Put(column, std::string(names[value.index()]));
+    }
+    template <class R>
+    bool TakePart(const std::string& flag, const std::optional<R>& part)
+    {
+        if (places.HasColumn(flag)) Put(flag, part.has_value());
         return part.has_value();
     }
-    template <class T>
-    void Array(const char* name, const std::vector<T>& values)
-    {
-        if (!values.empty()) PutArray(name, std::span<const T>(values));
-    }
-    template <class T, std::size_t N>
-    void Array(const char* name, const std::optional<std::array<T, N>>& values)
-    {
-        if (values) PutArray(name, std::span<const T>(*values));
-    }
-    /// The nested members of a record as text.
-    template <class R>
-    void Body(const R& record)
-    {
-        std::string text;
-        T_FILE_ERROR error;
-        if (!PrintBody(record, text, error)) {
-            throw CStoreFault(FILE_FAULT::BadInput, "IDS_QM_DB_FILE_BAD_RECORD",
-                              m_row.Table() + ' ' + std::to_string(m_row.Key()) + ' ' + error.text);
-        }
-        m_row.Put("body", std::move(text));
-    }
-    template <class R>
-    void BodyIf(const R& record, bool isThere)
-    {
-        if (isThere) Body(record);
-    }
-    void Kind(const T_SPFC_D& spectrum)
-    {
-        m_row.Put("kind", std::string(kSpectrumKinds[spectrum.data.index()]));
-    }
+
+    const CTablePlaces& places;
 
 private:
+    void Put(const std::string& column, int value) { m_row.Put(column, std::int64_t{value}); }
+    void Put(const std::string& column, bool value) { Put(column, value ? 1 : 0); }
+    void Put(const std::string& column, double value) { m_row.Put(column, value); }
+    void Put(const std::string& column, char value) { m_row.Put(column, std::string(1, value)); }
+    void Put(const std::string& column, const std::string& value) { m_row.Put(column, value); }
     template <class T>
-    void PutArray(const char* name, std::span<const T> values)
+    requires std::is_arithmetic_v<T> || std::is_same_v<T, std::string>
+    void Put(const std::string& column, const std::optional<T>& value)
+    {
+        if (value) Put(column, *value);
+    }
+    template <class T>
+    void PutList(const char* name, const std::vector<T>& values)
+    {
+        if (!values.empty()) PutNumbers(name, std::span<const T>(values));
+    }
+    template <class T, std::size_t N>
+    void PutList(const char* name, const std::optional<std::array<T, N>>& values)
+    {
+        if (values) PutNumbers(name, std::span<const T>(*values));
+    }
+    /// Two lists: node ids, and six components per node.
+    void PutList(const char* name, const std::map<int, T_DOF6>& byNode);
+    template <class T>
+    void PutNumbers(const char* name, std::span<const T> values)
     {
         m_arrays.Put(m_row.Table(), m_row.Key(), name, values);
     }
 
     CRecordRow& m_row;
     CPackedArrays& m_arrays;
+    CJsonWriter m_text{kSiUnits};
+    CCasePut m_body{m_text};
 };
 
-class CFieldGet {
+class CRowGet : public CRowWords<CRowGet> {
 public:
     template <class T>
     using Ref = T&;
-    CFieldGet(const CRecordRow& row, const CPackedArrays& arrays) : m_row(row), m_arrays(arrays) {}
+    static constexpr bool kReads = true;
+    static constexpr bool kWrites = false;
 
-    void operator()(const std::string& column, int& value) const
-    {
-        const auto whole = Need<std::int64_t>(column);
-        if (whole < std::numeric_limits<int>::min() || whole > std::numeric_limits<int>::max())
-            m_row.ThrowBadCell(column);
-        value = static_cast<int>(whole);
-    }
-    void operator()(const std::string& column, bool& value) const
-    {
-        const auto whole = Need<std::int64_t>(column);
-        if (whole != 0 && whole != 1) m_row.ThrowBadCell(column);
-        value = whole == 1;
-    }
-    void operator()(const std::string& column, double& value) const
-    {
-        value = Need<double>(column);
-    }
-    void operator()(const std::string& column, char& value) const
-    {
-        const auto& text = Need<std::string>(column);
-        if (text.size() != 1) m_row.ThrowBadCell(column);
-        value = text.front();
-    }
-    void operator()(const std::string& column, std::string& value) const
-    {
-        value = Need<std::string>(column);
-    }
-    void operator()(const std::string& column, FORCE_UNIT& value) const
-    {
-        TakeUnit(column, ForceUnitFromName(Need<std::string>(column)), value);
-    }
-    void operator()(const std::string& column, LENGTH_UNIT& value) const
-    {
-        TakeUnit(column, LengthUnitFromName(Need<std::string>(column)), value);
-    }
-    void operator()(const std::string& column, PUSH_METHOD& value) const
-    {
-        int code = 0;
-        (*this)(column, code);
-        value = static_cast<PUSH_METHOD>(code);
-        if (value < PUSH_METHOD::Fema440 || value > PUSH_METHOD::Ntc2018)
-            m_row.ThrowBadCell(column);
-    }
-    void operator()(const std::string& column, MODEL_PLANE& value) const
-    {
-        int code = 0;
-        (*this)(column, code);
-        value = static_cast<MODEL_PLANE>(code);
-        if (value < MODEL_PLANE::XY || value > MODEL_PLANE::YZ) m_row.ThrowBadCell(column);
-    }
-    template <class T>
-    void operator()(const std::string& column, std::optional<T>& value) const
-    {
-        if (!IsNull(column)) (*this)(column, value.emplace());
-    }
+    CRowGet(const CRecordRow& row, const CPackedArrays& arrays, const CTablePlaces& where);
+    void Finish();
 
-    const CRecordRow& Row() const { return m_row; }
-    const CPackedArrays& Arrays() const { return m_arrays; }
+    CCaseGet& Body() { return m_body; }
+    bool Has(const char* key) { return m_body.Has(key); }
+    void Must(const char* key) { m_body.Must(key); }
+
     template <class T>
-    void Flag(const std::string& column, std::optional<T>& part) const
+    bool Cell(const char* key, T& value)
+    {
+        if (places.Find(key, MEMBER_PLACE::Packed)) return true;
+        if (const char* const list = places.Find(key, MEMBER_PLACE::List)) {
+            if constexpr (requires { GetList(list, value); }) return GetList(list, value), true;
+        }
+        const std::string column = ColumnOf(key);
+        if constexpr (requires { Get(column, value); }) {
+            if (!column.empty()) return Get(column, value), true;
+        }
+        return false;
+    }
+    template <int kFirst, class E>
+    bool CellOf(const char* key, E& value, std::span<const char* const> names)
+    {
+        const std::string column = ColumnOf(key);
+        if (column.empty()) return places.Find(key, MEMBER_PLACE::Packed) != nullptr;
+        value = static_cast<E>(CodeOf(column, kFirst, names));
+        return true;
+    }
+    template <int kFirst, class E>
+    bool CellOf(const char* key, std::optional<E>& value, std::span<const char* const> names)
+    {
+        const std::string column = ColumnOf(key);
+        if (column.empty()) return false;
+        if (!IsNull(column)) (void)CellOf<kFirst>(key, value.emplace(), names);
+        return true;
+    }
+    template <class... T>
+    void Variant(const char* key, std::variant<T...>& value, std::span<const char* const> names,
+                 const char* what)
+    {
+        static const std::array<std::variant<T...>, sizeof...(T)> kBlank{T{}...};
+        const std::string column = ColumnOf(key);
+        if (column.empty()) return m_body.Variant(key, value, names, what);
+        value = kBlank[static_cast<std::size_t>(CodeOf(column, 0, names))];
+    }
+    template <class R>
+    bool TakePart(const std::string& flag, std::optional<R>& part)
     {
         bool isThere = false;
-        (*this)(column, isThere);
+        if (places.HasColumn(flag))
+            Get(flag, isThere);
+        else
+            isThere = m_row.HasAny(m_prefix);
         if (isThere) part.emplace();
+        return isThere;
+    }
+
+    const CTablePlaces& places;
+
+private:
+    void Get(const std::string& column, int& value) const;
+    void Get(const std::string& column, bool& value) const;
+    void Get(const std::string& column, char& value) const;
+    void Get(const std::string& column, double& value) const { value = Take<double>(column); }
+    void Get(const std::string& column, std::string& value) const
+    {
+        value = Take<std::string>(column);
     }
     template <class T>
-    bool Part(const std::string& column, std::optional<T>& part) const
+    requires std::is_arithmetic_v<T> || std::is_same_v<T, std::string>
+    void Get(const std::string& column, std::optional<T>& value) const
     {
-        if (!IsNull(column)) part.emplace();
-        return part.has_value();
+        if (!IsNull(column)) Get(column, value.emplace());
     }
-    void Array(const char* name, std::vector<int>& values) const
+    void GetList(const char* name, std::vector<int>& values) const
     {
         values = m_arrays.Ints(m_row.Table(), m_row.Key(), name);
     }
-    void Array(const char* name, std::vector<double>& values) const
+    void GetList(const char* name, std::vector<double>& values) const
     {
         values = m_arrays.Doubles(m_row.Table(), m_row.Key(), name);
     }
     template <class T, std::size_t N>
-    void Array(const char* name, std::optional<std::array<T, N>>& values) const
+    void GetList(const char* name, std::optional<std::array<T, N>>& values) const
     {
         if (!m_arrays.Has(m_row.Table(), m_row.Key(), name)) return;
         std::vector<T> list;
-        Array(name, list);
+        GetList(name, list);
         if (list.size() != N) m_row.ThrowBadCell(name);
         std::copy(list.begin(), list.end(), values.emplace().begin());
     }
-    template <class R>
-    void Body(R& record) const
-    {
-        T_FILE_ERROR error;
-        if (!ParseBody(Need<std::string>("body"), record, error)) m_row.ThrowBadCell("body");
-    }
-    template <class R>
-    void BodyIf(R& record, bool) const
-    {
-        if (!IsNull("body")) Body(record);
-    }
-    void Kind(T_SPFC_D& spectrum) const
-    {
-        static const std::array<decltype(T_SPFC_D::data), kSpectrumKinds.size()> kBlank{
-            T_SPFC_ATC40{}, T_SPFC_EURO2003{}, T_SPFC_EURO1996{}, T_SPFC_NTC{}, T_SPFC_USER{}};
-        const auto& name = Need<std::string>("kind");
-        for (std::size_t i = 0; i < kBlank.size(); ++i) {
-            if (name == kSpectrumKinds[i]) {
-                spectrum.data = kBlank[i];
-                return;
-            }
-        }
-        m_row.ThrowBadCell("kind");
-    }
-
-private:
+    void GetList(const char* name, std::map<int, T_DOF6>& byNode) const;
+    /// A number or a name out of the list.
+    int CodeOf(const std::string& column, int first, std::span<const char* const> names) const;
     bool IsNull(const std::string& column) const
     {
         return std::holds_alternative<std::monostate>(m_row.Get(column));
     }
     template <class T>
-    const T& Need(const std::string& column) const
+    const T& Take(const std::string& column) const
     {
         const T* const value = std::get_if<T>(&m_row.Get(column));
         if (!value) m_row.ThrowBadCell(column);
         return *value;
     }
-    template <class U>
-    void TakeUnit(const std::string& column, const std::optional<U>& unit, U& value) const
-    {
-        if (!unit) m_row.ThrowBadCell(column);
-        value = *unit;
-    }
+    T_JSON TextOf() const;
 
     const CRecordRow& m_row;
     const CPackedArrays& m_arrays;
+    T_FILE_ERROR m_error;
+    T_JSON m_document;
+    CJsonReader m_in{&m_document, {}, m_error};
+    CCaseGet m_body{m_in, kSiUnits};
 };
+
+/// Name and members of a record.
+template <class V, class R>
+void RowFields(V& v, R& r)
+{
+    if constexpr (kHasName<R>) v.Need("name", r.name);
+    CaseFields(v, r);
+    v.Finish();
+}

@@ -56,6 +56,13 @@ const CRecordRow::Cell& CRecordRow::Get(const std::string& column) const
     return it == m_cells.end() ? null : it->second;
 }
 
+bool CRecordRow::HasAny(std::string_view prefix) const
+{
+    return std::any_of(m_cells.begin(), m_cells.end(), [&](const auto& cell) {
+        return cell.first.starts_with(prefix) && cell.second.index() != 0;
+    });
+}
+
 void CRecordRow::ThrowBadCell(const std::string& column) const
 {
     ThrowDamaged(m_table + ' ' + std::to_string(m_key) + ' ' + column);

@@ -3,6 +3,7 @@
 
 #include <cstdint>
 #include <string>
+#include <string_view>
 #include <utility>
 #include <variant>
 #include <vector>
@@ -24,6 +25,8 @@ public:
     void Put(const std::string& column, Cell value);
     /// NULL for a column that is not there.
     const Cell& Get(const std::string& column) const;
+    /// Whether a column whose name begins so is not NULL.
+    bool HasAny(std::string_view prefix) const;
     /// Throws "damaged", naming table, key and column.
     [[noreturn]] void ThrowBadCell(const std::string& column) const;
 

@@ -1,0 +1,91 @@
+#include "qm_db/casefile/caseget.h"
+
+const char* CCaseGet::OptOr(const char* key, const char* old, double& out, double missing,
+                            T_DIM dim)
+{
+    const bool older = old && Has(old);
+    if (older && Has(key))
+        m_in.FailAt(key, std::string("the same as \"") + old + "\", which is there too");
+    Opt(older ? old : key, out, missing, dim);
+    return older ? old : key;
+}
+
+void CCaseGet::Texts(const char* key, std::vector<std::string>& out)
+{
+    if (!Has(key)) return;
+    m_in.Member(key).ForEachItem(
+        [&](CJsonReader& item, std::size_t) { item.Read(out.emplace_back()); });
+}
+
+void CCaseGet::NeedRef(const char* key, int& out, RECORD_KIND kind)
+{
+    if (!Take(key)) return;
+    CJsonReader member = m_in.Member(key);
+    const bool byKey = kind == KindOf<T_MATL_D>() || kind == KindOf<T_SECT_D>();
+    if (!m_names || (byKey && !member.IsText())) {
+        member.Read(out);
+        if (m_names && out != 0 && !m_names->HasKey(kind, out)) FailRef(member, kind);
+        return;
+    }
+    std::string name;
+    member.Read(name);
+    const std::optional<int> found = m_names->KeyOf(kind, name);
+    if (!found) FailRef(member, kind);
+    out = found.value_or(0);
+}
+
+void CCaseGet::KeyRef(const char* key, int& out, RECORD_KIND kind)
+{
+    if (!Take(key)) return;
+    CJsonReader member = m_in.Member(key);
+    member.Read(out);
+    if (m_names && !m_names->HasKey(kind, out)) FailRef(member, kind);
+}
+
+void CCaseGet::NodePair(const char* key, int& nodeI, int& nodeJ, std::size_t count,
+                        const char* reason)
+{
+    std::vector<int> nodes;
+    NodeList(key, nodes);
+    Rule(key, nodes.size() == count, reason);
+    nodes.resize(2);
+    nodeI = nodes[0];
+    nodeJ = nodes[1];
+}
+
+void CCaseGet::StageStep(const char* key, int& step, int missing)
+{
+    step = missing;
+    if (!Has(key)) return;
+    CJsonReader member = m_in.Member(key);
+    if (member.IsText()) {
+        step = member.Choice(kStageStepNames, "step") == 0 ? kStageFirstStep : kStageLastStep;
+        return;
+    }
+    member.Read(step);
+    if (step < kStageFirstStep) member.Fail("steps count from 1");
+}
+
+void CCaseGet::NodeTable(const char* key, std::map<int, T_DOF6>& out)
+{
+    if (!Take(key)) return;
+    m_in.Member(key).ForEachNode([&](CJsonReader& values, int node) {
+        if (m_names && !m_names->HasNode(node)) values.Fail("there is no such node");
+        values.Read(out[node]);
+    });
+}
+
+void CCaseGet::OptElements(const char* key, std::vector<int>& ids)
+{
+    ids.clear();
+    if (!Has(key)) return;
+    Need(key, ids);
+    CheckIds(
+        key, ids, [&](int id) { return m_names->HasElement(id); }, "there is no such element",
+        "the element appears twice");
+}
+
+void CCaseGet::FailRef(CJsonReader& in, RECORD_KIND kind)
+{
+    WithKind(kind, [&](const auto& row) { in.Fail(std::string("there is no such ") + row.noun); });
+}

@@ -1,0 +1,195 @@
+// Members of the records of pushover load cases, spectra and evaluations; see fieldwords.h.
+#pragma once
+
+#include "qm_db/records/structfields.h"
+
+#include <utility>
+
+// ---- pushover load cases ------------------------------------------------------------------------
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_POLC_PATTERN> r)
+{
+    v.Enum("kind", r.kind, kPatternNames, "pattern");
+    if (r.kind == 0)
+        v.KeyRef("number", r.number, KindOf<T_STLD_D>());
+    else
+        v.Need("number", r.number);
+    v.Opt("factor", r.factor, 1.0);
+}
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_POLC_CONTROL> r)
+{
+    static const T_POLC_CONTROL d;
+    v.Code("increment_method", r.incrementMethod, kIncrementNames, "increment method");
+    v.Opt("increment_option", r.incrementOption, d.incrementOption);
+    v.Opt("increment_function", r.incrementFunction, d.incrementFunction);
+    v.Opt("stiffness_ratio_limit", r.stiffnessRatioLimit, d.stiffnessRatioLimit);
+    v.Opt("generate_static_angle", r.generateStaticAngle, d.generateStaticAngle);
+    v.Opt("static_angle", r.staticAngle, d.staticAngle);
+    v.Opt("master_node_control", r.masterNodeControl, d.masterNodeControl);
+    v.Opt("master_max_displ", r.masterMaxDispl, d.masterMaxDispl, kDimLength);
+    v.Opt("max_trans_displ", r.maxTransDispl, d.maxTransDispl, kDimLength);
+}
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_POLC_D> r)
+{
+    v.Need("control_node", r.controlNode);
+    v.template Enum<1>("direction", r.direction, kDirectionNames, "direction");
+    v.Group("pattern", [&](auto& pattern) {
+        pattern.Enum("kind", r.patternKind, kPatternNames, "pattern");
+        pattern.Opt("modes", r.modes, {});
+    });
+    v.List("patterns", r.patterns);
+    v.PartIf("control", r.control);
+}
+
+/// They stand in the load case that they belong to.
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_POVR_D> r)
+{
+    const auto isStep = [](int step) { return step >= -2; };
+    v.OptIf("EC8", r.ec8);
+    if (r.ec8) v.CheckEach("EC8", *r.ec8, isStep, "a step is -2 or above");
+    v.OptIf("NTC", r.ntc);
+    if (r.ntc) v.CheckEach("NTC", *r.ntc, isStep, "a step is -2 or above");
+}
+
+// ---- spectra ------------------------------------------------------------------------------------
+
+template <class V>
+void CheckAbove(V& v, const char* key, double value)
+{
+    v.Check(key, value > 0.0, "the value must be above 0");
+}
+
+template <class V>
+void DampingField(V& v, T_FIELD_REF<V, std::optional<double>> damping)
+{
+    v.OptIf("damping", damping);
+    v.Check("damping", damping.value_or(0.0) >= 0.0, "damping can't be negative");
+}
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_SPFC_ATC40> r)
+{
+    v.Need("Ca", r.Ca);
+    CheckAbove(v, "Ca", r.Ca);
+    v.Need("Cv", r.Cv);
+    CheckAbove(v, "Cv", r.Cv);
+    v.OptIf("floors", r.floors);
+}
+
+/// Corner periods that are given ascend; the others come from the table of the code.
+inline bool AreOrdered(const std::optional<double>& a, const std::optional<double>& b)
+{
+    return !a || !b || *a <= *b;
+}
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_SPFC_EURO2003> r)
+{
+    v.Need("type", r.type);
+    v.Check("type", r.type == 1 || r.type == 2, "the type is 1 or 2");
+    v.Letter("soil", r.soil, std::span(kSoils), "soil");
+    v.Need("ag", r.ag);
+    CheckAbove(v, "ag", r.ag);
+    DampingField(v, r.damping);
+    const auto override = [&](const char* key, auto& value) {
+        v.OptIf(key, value);
+        CheckAbove(v, key, value.value_or(1.0));
+    };
+    override("S", r.S);
+    override("TB", r.TB);
+    override("TC", r.TC);
+    override("TD", r.TD);
+    v.Check("TC", AreOrdered(r.TB, r.TC), "TC is below TB");
+    v.Check("TD", AreOrdered(r.TB, r.TD), "TD is below TB");
+    v.Check("TD", AreOrdered(r.TC, r.TD), "TD is below TC");
+}
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_SPFC_EURO1996> r)
+{
+    v.Letter("soil", r.soil, std::span(kSoils).first(3), "soil");
+    v.Need("ag", r.ag);
+    CheckAbove(v, "ag", r.ag);
+    DampingField(v, r.damping);
+}
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_SPFC_NTC_STATE> r)
+{
+    v.Need("ag", r.ag);
+    CheckAbove(v, "ag", r.ag);
+    v.Need("F0", r.F0);
+    CheckAbove(v, "F0", r.F0);
+    v.Need("TC*", r.TCstar);
+    CheckAbove(v, "TC*", r.TCstar);
+}
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_SPFC_NTC> r)
+{
+    v.Letter("soil", r.soil, std::span(kSoils), "soil");
+    v.template Enum<1>("topography", r.topography, kTopographies, "topography");
+    DampingField(v, r.damping);
+    v.NeedGroup("limit_states", [&](auto& states) {
+        for (std::size_t i = 0; i < r.states.size(); ++i)
+            states.PartIf(kLimitStateNames[i], r.states[i]);
+    });
+}
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_SPFC_USER> r)
+{
+    const auto isNotNegative = [](double value) { return value >= 0.0; };
+    double before = -1.0;
+    const auto isAscending = [&](double T) { return T > std::exchange(before, T); };
+    v.Need("T", r.T);
+    v.Check("T", r.T.size() >= 2, "a spectrum needs at least 2 points");
+    v.CheckEach("T", r.T, isNotNegative, "a period can't be negative");
+    v.CheckEach("T", r.T, isAscending, "periods must ascend");
+    v.Need("Sa", r.Sa);
+    v.CheckEach("Sa", r.Sa, isNotNegative, "Sa can't be negative");
+    v.OptIf("gravity", r.gravity, kDimAccel);
+    v.Check("gravity", r.gravity.value_or(1.0) > 0.0, "gravity must be above 0");
+}
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_SPFC_D> r)
+{
+    v.Variant("kind", r.data, kSpectrumKinds, "spectrum kind");
+    std::visit([&](auto& data) { CaseFields(v, data); }, r.data);
+}
+
+// ---- evaluations --------------------------------------------------------------------------------
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_EVAL_BILINEAR> r)
+{
+    v.WordIf("rule", r.rule, kBilinearRules, "bilinear rule");
+    v.OptIf("secant", r.secant);
+    v.OptIf("drop", r.drop);
+    v.OptIf("iterate", r.iterate);
+}
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_EVAL_D> r)
+{
+    v.NameRef("push", r.push, KindOf<T_POLC_D>());
+    v.template Enum<kFirstMethod>("method", r.method, kMethodNames, "method");
+    v.LetterIf("procedure", r.procedure, kProcedures, "procedure");
+    v.NameRef("spectrum", r.spectrum, KindOf<T_SPFC_D>());
+    v.OptIf("behavior", r.behavior);
+    v.OptIf("elastic_damping", r.elasticDamping);
+    v.OptIf("user_damping", r.userDamping);
+    v.OptIf("eigen_factors", r.eigenFactors);
+    v.OptIf("masonry", r.masonry);
+    v.OptIf("drift_kind", r.driftKind);
+    v.OptIf("plot_type", r.plotType);
+    v.OptIf("alpha_in_percent", r.alphaInPercent);
+    v.PartIf("bilinear", r.bilinear);
+}
