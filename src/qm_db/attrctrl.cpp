@@ -3,7 +3,6 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_db/records/lcomflatten.h"
-#include "qm_db/records/recordunits.h"
 
 #include <set>
 #include <utility>
@@ -11,27 +10,6 @@
 using zql::lib::MMSGFunction;
 
 namespace {
-
-template <class T>
-int Get(const T_TABLE<T>& table, int key, const T_UNITS& units, T& out)
-{
-    const auto it = table.find(key);
-    if (it == table.end()) return 0;
-    out = it->second;
-    RecordFromSi(out, units);
-    return 1;
-}
-
-template <class T>
-int FindByName(const T_TABLE<T>& table, std::string_view name, int& key)
-{
-    for (const auto& [k, record] : table) {
-        if (record.name != name) continue;
-        key = k;
-        return 1;
-    }
-    return 0;
-}
 
 /// The same in every language: reports are compared by them.
 std::string StepName(const T_STAG_D& stage, int step)
@@ -67,47 +45,12 @@ int CAttrCtrl::GetStyp(T_STYP_D& out) const
     return 1;
 }
 
-int CAttrCtrl::GetNode(int id, T_NODE_D& out) const
-{
-    return Get(m_data.Model().nodes, id, m_data.Units(), out);
-}
-
 int CAttrCtrl::GetConsNode(int id, std::array<int, 6>& out) const
 {
     const auto it = m_data.Model().nodes.find(id);
     if (it == m_data.Model().nodes.end()) return 0;
     out = it->second.restraint;
     return 1;
-}
-
-int CAttrCtrl::GetPolc(int key, T_POLC_D& out) const
-{
-    return Get(m_data.Model().pushovers, key, m_data.Units(), out);
-}
-
-int CAttrCtrl::GetSpfc(int key, T_SPFC_D& out) const
-{
-    return Get(m_data.Model().spectra, key, m_data.Units(), out);
-}
-
-int CAttrCtrl::GetEval(int key, T_EVAL_D& out) const
-{
-    return Get(m_data.Model().evaluations, key, m_data.Units(), out);
-}
-
-int CAttrCtrl::GetMatl(int key, T_MATL_D& out) const
-{
-    return Get(m_data.Model().materials, key, m_data.Units(), out);
-}
-
-int CAttrCtrl::GetSect(int key, T_SECT_D& out) const
-{
-    return Get(m_data.Model().sections, key, m_data.Units(), out);
-}
-
-int CAttrCtrl::GetElem(int id, T_ELEM_D& out) const
-{
-    return Get(m_data.Model().elements, id, m_data.Units(), out);
 }
 
 int CAttrCtrl::GetPhgt(int key, T_PHGT_D& out) const
@@ -120,72 +63,16 @@ int CAttrCtrl::GetPhgt(int key, T_PHGT_D& out) const
     return 1;
 }
 
-int CAttrCtrl::GetPhge(int key, T_PHGE_D& out) const
-{
-    return Get(m_data.Model().hinges, key, m_data.Units(), out);
-}
-
-int CAttrCtrl::GetIehp(int key, T_IEHP_D& out) const
-{
-    return Get(m_data.Model().inelasticHinges, key, m_data.Units(), out);
-}
-
-int CAttrCtrl::GetPofc(int key, T_POFC_D& out) const
-{
-    return Get(m_data.Model().incrementFunctions, key, m_data.Units(), out);
-}
-
-int CAttrCtrl::GetDiap(int key, T_DIAP_D& out) const
-{
-    return Get(m_data.Model().diaphragms, key, m_data.Units(), out);
-}
-
-int CAttrCtrl::GetEqds(int key, T_EQDS_D& out) const
-{
-    return Get(m_data.Model().equalDisplacements, key, m_data.Units(), out);
-}
-
-int CAttrCtrl::GetStld(int key, T_STLD_D& out) const
-{
-    return Get(m_data.Model().loadCases, key, m_data.Units(), out);
-}
-
-int CAttrCtrl::GetLcom(int key, T_LCOM_D& out) const
-{
-    return Get(m_data.Model().combinations, key, m_data.Units(), out);
-}
-
-int CAttrCtrl::GetUlfc(int key, T_ULFC_D& out) const
-{
-    return Get(m_data.Model().ulfConstraints, key, m_data.Units(), out);
-}
-
-int CAttrCtrl::GetUlfi(int key, T_ULFI_D& out) const
-{
-    return Get(m_data.Model().ulfItems, key, m_data.Units(), out);
-}
-
 int CAttrCtrl::GetLcom_(std::string_view name, T_LCOM_D& out) const
 {
     int key = 0;
-    return FindLcom(name, key) && GetLcom(key, out);
+    return Find<T_LCOM_D>(name, key) && GetLcom(key, out);
 }
 
 int CAttrCtrl::GetUlfc_(std::string_view name, T_ULFC_D& out) const
 {
     int key = 0;
-    return FindUlfc(name, key) && GetUlfc(key, out);
-}
-
-bool CAttrCtrl::ExistLcom(std::string_view name) const
-{
-    int key = 0;
-    return FindLcom(name, key) != 0;
-}
-
-int CAttrCtrl::GetLcomKey(std::string_view name, int& key) const
-{
-    return FindLcom(name, key);
+    return Find<T_ULFC_D>(name, key) && GetUlfc(key, out);
 }
 
 int CAttrCtrl::NormalizeLcom(const T_LCOM_D& in, T_LCOM_D& out, std::string& error) const
@@ -216,87 +103,12 @@ std::vector<int> CAttrCtrl::GetElemsByPhgt(int hingeType) const
     return ElementsWithHingeType(m_data.Model(), hingeType);
 }
 
-int CAttrCtrl::FindPolc(std::string_view name, int& key) const
-{
-    return FindByName(m_data.Model().pushovers, name, key);
-}
-
-int CAttrCtrl::FindSpfc(std::string_view name, int& key) const
-{
-    return FindByName(m_data.Model().spectra, name, key);
-}
-
-int CAttrCtrl::FindMatl(std::string_view name, int& key) const
-{
-    return FindByName(m_data.Model().materials, name, key);
-}
-
-int CAttrCtrl::FindSect(std::string_view name, int& key) const
-{
-    return FindByName(m_data.Model().sections, name, key);
-}
-
-int CAttrCtrl::FindPhgt(std::string_view name, int& key) const
-{
-    return FindByName(m_data.Model().hingeTypes, name, key);
-}
-
-int CAttrCtrl::FindIehp(std::string_view name, int& key) const
-{
-    return FindByName(m_data.Model().inelasticHinges, name, key);
-}
-
-int CAttrCtrl::FindPofc(std::string_view name, int& key) const
-{
-    return FindByName(m_data.Model().incrementFunctions, name, key);
-}
-
-int CAttrCtrl::FindStld(std::string_view name, int& key) const
-{
-    return FindByName(m_data.Model().loadCases, name, key);
-}
-
-int CAttrCtrl::FindLcom(std::string_view name, int& key) const
-{
-    return FindByName(m_data.Model().combinations, name, key);
-}
-
-int CAttrCtrl::FindUlfc(std::string_view name, int& key) const
-{
-    return FindByName(m_data.Model().ulfConstraints, name, key);
-}
-
-int CAttrCtrl::FindUlfi(std::string_view name, int& key) const
-{
-    return FindByName(m_data.Model().ulfItems, name, key);
-}
-
 // ---- construction stages ------------------------------------------------------------------------
-
-int CAttrCtrl::GetStag(int key, T_STAG_D& out) const
-{
-    return Get(m_data.Model().stages, key, m_data.Units(), out);
-}
-
-int CAttrCtrl::GetUlsi(int key, T_ULSI_D& out) const
-{
-    return Get(m_data.Model().ulfStageItems, key, m_data.Units(), out);
-}
 
 int CAttrCtrl::GetStct(T_STCT_D& out) const
 {
     out = m_data.Model().styp.stageControl;
     return 1;
-}
-
-int CAttrCtrl::FindStag(std::string_view name, int& key) const
-{
-    return FindByName(m_data.Model().stages, name, key);
-}
-
-int CAttrCtrl::FindUlsi(std::string_view name, int& key) const
-{
-    return FindByName(m_data.Model().ulfStageItems, name, key);
 }
 
 int CAttrCtrl::GetStagStepInfo(int stage, int step, T_STAG_STEP_INFO& out) const

@@ -3,6 +3,7 @@
 
 #include "qm_db/datactrl.h"
 #include "qm_db/records/hingetype.h"
+#include "qm_db/records/recordunits.h"
 
 #include <string>
 #include <string_view>
@@ -24,31 +25,49 @@ class CAttrCtrl {
 public:
     explicit CAttrCtrl(const CDataCtrl& data) : m_data(data) {}
 
+    /// A record of any kind by its key or id.
+    template <class R>
+    [[nodiscard]] int Get(int key, R& out) const
+    {
+        const T_TABLE<R>& table = TableOf<R>(m_data.Model());
+        const auto it = table.find(key);
+        if (it == table.end()) return 0;
+        out = it->second;
+        RecordFromSi(out, m_data.Units());
+        return 1;
+    }
+    /// Key of the record with that name.
+    template <class R>
+    [[nodiscard]] int Find(std::string_view name, int& key) const
+    {
+        for (const auto& [k, record] : TableOf<R>(m_data.Model())) {
+            if (record.name != name) continue;
+            key = k;
+            return 1;
+        }
+        return 0;
+    }
+
     /// Title, units and gravity of the model; gravity only where the model states one.
     [[nodiscard]] int GetStyp(T_STYP_D& out) const;
-    [[nodiscard]] int GetNode(int id, T_NODE_D& out) const;
+    [[nodiscard]] int GetNode(int id, T_NODE_D& out) const { return Get(id, out); }
     /// Restraints of a node, 1 where restrained, in the order X, Y, Z, RX, RY, RZ.
     [[nodiscard]] int GetConsNode(int id, std::array<int, 6>& out) const;
-    [[nodiscard]] int GetPolc(int key, T_POLC_D& out) const;
-    [[nodiscard]] int GetSpfc(int key, T_SPFC_D& out) const;
-    [[nodiscard]] int GetEval(int key, T_EVAL_D& out) const;
-    [[nodiscard]] int GetMatl(int key, T_MATL_D& out) const;
-    [[nodiscard]] int GetSect(int key, T_SECT_D& out) const;
-    [[nodiscard]] int GetElem(int id, T_ELEM_D& out) const;
+    [[nodiscard]] int GetPolc(int key, T_POLC_D& out) const { return Get(key, out); }
+    [[nodiscard]] int GetSpfc(int key, T_SPFC_D& out) const { return Get(key, out); }
+    [[nodiscard]] int GetEval(int key, T_EVAL_D& out) const { return Get(key, out); }
+    [[nodiscard]] int GetMatl(int key, T_MATL_D& out) const { return Get(key, out); }
+    [[nodiscard]] int GetSect(int key, T_SECT_D& out) const { return Get(key, out); }
+    [[nodiscard]] int GetElem(int id, T_ELEM_D& out) const { return Get(id, out); }
     [[nodiscard]] int GetPhgt(int key, T_PHGT_D& out) const;
-    [[nodiscard]] int GetPhge(int key, T_PHGE_D& out) const;
-    [[nodiscard]] int GetIehp(int key, T_IEHP_D& out) const;
-    [[nodiscard]] int GetPofc(int key, T_POFC_D& out) const;
-    [[nodiscard]] int GetDiap(int key, T_DIAP_D& out) const;
-    [[nodiscard]] int GetEqds(int key, T_EQDS_D& out) const;
-    [[nodiscard]] int GetStld(int key, T_STLD_D& out) const;
+    [[nodiscard]] int GetPhge(int key, T_PHGE_D& out) const { return Get(key, out); }
+    [[nodiscard]] int GetPofc(int key, T_POFC_D& out) const { return Get(key, out); }
+    [[nodiscard]] int GetStld(int key, T_STLD_D& out) const { return Get(key, out); }
     /// Combinations are read as they are stored: NormalizeLcom flattens them.
-    [[nodiscard]] int GetLcom(int key, T_LCOM_D& out) const;
-    [[nodiscard]] int GetUlfc(int key, T_ULFC_D& out) const;
-    [[nodiscard]] int GetUlfi(int key, T_ULFI_D& out) const;
-    /// Construction stage, and unknown load factor item of construction stages.
-    [[nodiscard]] int GetStag(int key, T_STAG_D& out) const;
-    [[nodiscard]] int GetUlsi(int key, T_ULSI_D& out) const;
+    [[nodiscard]] int GetLcom(int key, T_LCOM_D& out) const { return Get(key, out); }
+    [[nodiscard]] int GetUlfc(int key, T_ULFC_D& out) const { return Get(key, out); }
+    [[nodiscard]] int GetUlfi(int key, T_ULFI_D& out) const { return Get(key, out); }
+    [[nodiscard]] int GetStag(int key, T_STAG_D& out) const { return Get(key, out); }
     /// Control of the analysis in construction stages; every model has one.
     [[nodiscard]] int GetStct(T_STCT_D& out) const;
     /// Names of a step: "First Step", "User Step: 2", "Last Step" (step -1, and of a stage with
@@ -67,9 +86,16 @@ public:
     [[nodiscard]] int GetLcom_(std::string_view name, T_LCOM_D& out) const;
     [[nodiscard]] int GetUlfc_(std::string_view name, T_ULFC_D& out) const;
 
-    bool ExistLcom(std::string_view name) const;
+    bool ExistLcom(std::string_view name) const
+    {
+        int key = 0;
+        return GetLcomKey(name, key) != 0;
+    }
     /// Key of a general combination by name. 1 found; 0 not, output as it was.
-    [[nodiscard]] int GetLcomKey(std::string_view name, int& key) const;
+    [[nodiscard]] int GetLcomKey(std::string_view name, int& key) const
+    {
+        return Find<T_LCOM_D>(name, key);
+    }
     /// The combination with its nested combinations replaced by their load cases: each case once,
     /// in the order of first appearance, factors along the nesting multiplied and those of one case
     /// summed. 1 done; 0 `error` says why (a case or combination is missing, a combination contains
@@ -89,9 +115,6 @@ public:
     std::vector<int> GetStldKeys() const { return GetKeys<T_STLD_D>(); }
     std::vector<int> GetLcomKeys() const { return GetKeys<T_LCOM_D>(); }
     std::vector<int> GetUlfcKeys() const { return GetKeys<T_ULFC_D>(); }
-    std::vector<int> GetUlfiKeys() const { return GetKeys<T_ULFI_D>(); }
-    std::vector<int> GetStagKeys() const { return GetKeys<T_STAG_D>(); }
-    std::vector<int> GetUlsiKeys() const { return GetKeys<T_ULSI_D>(); }
 
     /// Section and material of an element. 0: no such element, or it lacks one of them; neither
     /// output is changed.
@@ -100,19 +123,30 @@ public:
     std::vector<int> GetElemsByPhgt(int hingeType) const;
 
     /// Key of the record with that name. 1 found; 0 not, output as it was.
-    [[nodiscard]] int FindPolc(std::string_view name, int& key) const;
-    [[nodiscard]] int FindSpfc(std::string_view name, int& key) const;
-    [[nodiscard]] int FindMatl(std::string_view name, int& key) const;
-    [[nodiscard]] int FindSect(std::string_view name, int& key) const;
-    [[nodiscard]] int FindPhgt(std::string_view name, int& key) const;
-    [[nodiscard]] int FindIehp(std::string_view name, int& key) const;
-    [[nodiscard]] int FindPofc(std::string_view name, int& key) const;
-    [[nodiscard]] int FindStld(std::string_view name, int& key) const;
-    [[nodiscard]] int FindLcom(std::string_view name, int& key) const;
-    [[nodiscard]] int FindUlfc(std::string_view name, int& key) const;
-    [[nodiscard]] int FindUlfi(std::string_view name, int& key) const;
-    [[nodiscard]] int FindStag(std::string_view name, int& key) const;
-    [[nodiscard]] int FindUlsi(std::string_view name, int& key) const;
+    [[nodiscard]] int FindPolc(std::string_view name, int& key) const
+    {
+        return Find<T_POLC_D>(name, key);
+    }
+    [[nodiscard]] int FindSpfc(std::string_view name, int& key) const
+    {
+        return Find<T_SPFC_D>(name, key);
+    }
+    [[nodiscard]] int FindPhgt(std::string_view name, int& key) const
+    {
+        return Find<T_PHGT_D>(name, key);
+    }
+    [[nodiscard]] int FindStld(std::string_view name, int& key) const
+    {
+        return Find<T_STLD_D>(name, key);
+    }
+    [[nodiscard]] int FindUlfi(std::string_view name, int& key) const
+    {
+        return Find<T_ULFI_D>(name, key);
+    }
+    [[nodiscard]] int FindUlsi(std::string_view name, int& key) const
+    {
+        return Find<T_ULSI_D>(name, key);
+    }
 
     /// A hinge type of one active FEMA component out of an inelastic hinge, and its I-end's curve
     /// back; component 0 to 5. See ConvertIehpToPhgtFema.

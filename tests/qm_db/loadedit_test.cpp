@@ -78,7 +78,7 @@ TEST(LoadEdit, EveryRecordIsPutErasedAndUndone)
     T_ULFC_D constraint;
     T_ULFI_D item;
     CAttrCtrl& attr = doc.Attr();
-    EXPECT_TRUE(attr.GetDiap(1, diaphragm) && attr.GetEqds(1, equal) && attr.GetStld(4, load) &&
+    EXPECT_TRUE(attr.Get(1, diaphragm) && attr.Get(1, equal) && attr.GetStld(4, load) &&
                 attr.GetLcom(1, combination) && attr.GetUlfc(1, constraint) &&
                 attr.GetUlfi(1, item));
     EXPECT_TRUE(attr.GetLcom_("C", combination) && attr.GetUlfc_("D", constraint));
@@ -87,7 +87,7 @@ TEST(LoadEdit, EveryRecordIsPutErasedAndUndone)
     EXPECT_FALSE(attr.ExistLcom("c"));
     int key = 0;
     EXPECT_TRUE(attr.FindStld("G", key) && key == 4 && attr.GetLcomKey("C", key) && key == 1);
-    EXPECT_TRUE(attr.FindUlfc("D", key) && attr.FindUlfi("T", key));
+    EXPECT_TRUE(attr.Find<T_ULFC_D>("D", key) && attr.FindUlfi("T", key));
     EXPECT_EQ(0, attr.FindStld("C", key));
     EXPECT_EQ(std::vector<int>{4}, attr.GetStldKeys());
 

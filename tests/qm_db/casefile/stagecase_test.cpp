@@ -258,7 +258,7 @@ TEST(StageCase, RowsThatAreEditedComeBackFromEveryFile)
     CDBDoc doc;
     doc.Data().Assign(ParseGood(AllText()));
     T_ULSI_D item;
-    ASSERT_EQ(1, doc.Attr().GetUlsi(1, item));
+    ASSERT_EQ(1, doc.Attr().Get(1, item));
     std::swap(item.rows[0], item.rows[2]);
     item.rows[0].weight = 3.0; // of a known row: not used
     item.rows[0].pretension = true;
