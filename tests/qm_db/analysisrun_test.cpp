@@ -20,7 +20,8 @@ constexpr const char* kCantilever = R"({
   {"name": "tip", "nodal": [{"node": 20, "load": [0, 0, -12, 0, 0, 0]}]},
   {"name": "hot", "temperature": [{"element": 7, "change": 30}]},
   {"name": "own", "self_weight": [0, 0, -1]}],
- "combinations": [{"name": "C", "items": [{"case": "tip", "factor": 2}, {"case": "hot", "factor": 1}]}]
+ "combinations": [{"name": "C", "items": [{"case": "tip", "factor": 2}, {"case": "hot",
+  "factor": 1}]}]
 })";
 
 T_MODEL_CONTENT ContentOf(const char* text)
@@ -134,20 +135,34 @@ TEST(AnalysisRun, RefusalsNameIdsAndChangeNothing)
     using A = ANALYSIS_FAULT;
     // clang-format off
     const T_ROW rows[] = {
-        {[](T_MODEL& m) { m.elements.at(7).material = 0; }, A::BadModel, 0, 7, 0, -1, "beam 7: the material is missing"},
-        {[](T_MODEL& m) { m.elements.at(7).section = 5; }, A::BadModel, 0, 7, 0, -1, "beam 7: the section is missing"},
-        {[](T_MODEL& m) { m.elements.at(7).nodeJ = 30; }, A::BadModel, 0, 7, 0, -1, "beam 7: there is no node 30"},
-        {[](T_MODEL& m) { m.nodes.at(20).xyz = {}; }, A::BadModel, 0, 7, 0, -1, "beam 7: zero length"},
-        {[](T_MODEL& m) { m.sections.at(1).area = -1; }, A::BadModel, 0, 7, 0, -1, "beam 7: section \"B\": "},
-        {[](T_MODEL& m) { m.sections.at(1).area = 0; }, A::BadModel, 0, 7, 0, -1, "beam 7: the area A of its section is not positive"},
-        {[](T_MODEL& m) { m.sections.at(1).shape = SECT_SHAPE::Circle; }, A::BadModel, 0, 7, 0, -1, "beam 7: section \"B\": "},
-        {[](T_MODEL& m) { m.elements[9] = m.elements.at(7); m.elements[9].id = 9; }, A::BadModel, 0, 9, 0, -1, "beam 9: another element of the same kind"},
-        {[](T_MODEL& m) { m.nodes.at(10).restraint = {1, 1, 1, 0, 0, 0}; }, A::Mechanism, 10, 0, 0, 4, "part of 2 nodes at node 10: the part is free to turn about Y"},
-        {[](T_MODEL& m) { m.elements.at(7).release.I[4] = true; }, A::Mechanism, 20, 0, 0, 2, "node 20"},
-        {[](T_MODEL& m) { m.diaphragms[2] = {{20, 21}, 2}; }, A::BadModel, 21, 0, 0, -1, "diaphragm 2: there is no node 21"},
-        {[](T_MODEL& m) { m.loadCases.at(1).nodal[0].node = 21; }, A::BadModel, 21, 0, 1, -1, "load case \"tip\": there is no node 21"},
-        {[](T_MODEL& m) { m.loadCases.at(2).temperature[0].element = 8; }, A::BadModel, 0, 8, 2, -1, "load case \"hot\": there is no element 8"},
-        {[](T_MODEL& m) { m.loadCases.at(3).settlement = {{20, {0, 0, 1, 0, 0, 0}}}; }, A::BadModel, 20, 0, 3, -1, "load case \"own\", node 20"},
+        {[](T_MODEL& m) { m.elements.at(7).material = 0; }, A::BadModel, 0, 7, 0, -1,
+         "beam 7: the material is missing"},
+        {[](T_MODEL& m) { m.elements.at(7).section = 5; }, A::BadModel, 0, 7, 0, -1,
+         "beam 7: the section is missing"},
+        {[](T_MODEL& m) { m.elements.at(7).nodeJ = 30; }, A::BadModel, 0, 7, 0, -1,
+         "beam 7: there is no node 30"},
+        {[](T_MODEL& m) { m.nodes.at(20).xyz = {}; }, A::BadModel, 0, 7, 0, -1,
+         "beam 7: zero length"},
+        {[](T_MODEL& m) { m.sections.at(1).area = -1; }, A::BadModel, 0, 7, 0, -1,
+         "beam 7: section \"B\": "},
+        {[](T_MODEL& m) { m.sections.at(1).area = 0; }, A::BadModel, 0, 7, 0, -1,
+         "beam 7: the area A of its section is not positive"},
+        {[](T_MODEL& m) { m.sections.at(1).shape = SECT_SHAPE::Circle; }, A::BadModel, 0, 7, 0, -1,
+         "beam 7: section \"B\": "},
+        {[](T_MODEL& m) { m.elements[9] = m.elements.at(7); m.elements[9].id = 9; }, A::BadModel,
+         0, 9, 0, -1, "beam 9: another element of the same kind"},
+        {[](T_MODEL& m) { m.nodes.at(10).restraint = {1, 1, 1, 0, 0, 0}; }, A::Mechanism, 10, 0, 0,
+         4, "part of 2 nodes at node 10: the part is free to turn about Y"},
+        {[](T_MODEL& m) { m.elements.at(7).release.I[4] = true; }, A::Mechanism, 20, 0, 0, 2,
+         "node 20"},
+        {[](T_MODEL& m) { m.diaphragms[2] = {{20, 21}, 2}; }, A::BadModel, 21, 0, 0, -1,
+         "diaphragm 2: there is no node 21"},
+        {[](T_MODEL& m) { m.loadCases.at(1).nodal[0].node = 21; }, A::BadModel, 21, 0, 1, -1,
+         "load case \"tip\": there is no node 21"},
+        {[](T_MODEL& m) { m.loadCases.at(2).temperature[0].element = 8; }, A::BadModel, 0, 8, 2,
+         -1, "load case \"hot\": there is no element 8"},
+        {[](T_MODEL& m) { m.loadCases.at(3).settlement = {{20, {0, 0, 1, 0, 0, 0}}}; },
+         A::BadModel, 20, 0, 3, -1, "load case \"own\", node 20"},
     };
     // clang-format on
     for (const T_ROW& row : rows) {

@@ -5,8 +5,9 @@
 #include "qm_db/casefile.h"
 #include "qm_db/filectrl.h"
 
+#include <array>
 #include <gtest/gtest.h>
-#include <span>
+#include <sstream>
 
 inline std::string CaseText(const char* name)
 {
@@ -59,32 +60,46 @@ inline void ExpectLosslessInEveryUnit(const T_MODEL_CONTENT& content)
     }
 }
 
-/// One piece of a text replaced, the first one behind `after`, and what the reader says to it.
-struct T_SPOILT {
-    const char* after;
-    const char* from;
-    const char* to;
-    const char* message; // without the file; null: no valid JSON, whatever its words
-};
+/// Rows of a file of refusals: four texts apart by tabs (piece before the spot, what is replaced,
+/// by what, message without the file), with \\n and \\t for what a row can't hold.
+inline std::vector<std::array<std::string, 4>> RefusalRows(const char* name)
+{
+    std::vector<std::array<std::string, 4>> rows;
+    std::istringstream lines(CaseText(name));
+    for (std::string line; std::getline(lines, line);) {
+        if (line.empty() || line.front() == '#') continue;
+        std::size_t column = 0;
+        auto& row = rows.emplace_back();
+        for (std::size_t i = 0; i < line.size(); ++i) {
+            const bool escaped = line[i] == '\\' && i + 1 < line.size();
+            if (line[i] == '\t')
+                ++column;
+            else if (escaped)
+                row.at(column) += line[++i] == 'n' ? '\n' : line[i] == 't' ? '\t' : line[i];
+            else
+                row.at(column) += line[i];
+        }
+    }
+    return rows;
+}
 
-/// Each row alone is refused with its message and leaves the content as it was.
-inline void ExpectRefused(const std::string& good, std::span<const T_SPOILT> rows)
+/// Each row of the file alone is refused with its message and leaves the content as it was.
+inline void ExpectRefused(const std::string& good, const char* refusals)
 {
     const T_MODEL_CONTENT before = ParseGood(good);
-    for (const T_SPOILT& row : rows) {
+    const auto rows = RefusalRows(refusals);
+    EXPECT_FALSE(rows.empty());
+    for (const auto& [after, from, to, message] : rows) {
         std::string text = good;
-        const std::size_t after = text.find(row.after);
-        const std::size_t at = text.find(row.from, after);
-        ASSERT_NE(std::string::npos, after) << row.after;
-        ASSERT_NE(std::string::npos, at) << row.from;
-        text.replace(at, std::string(row.from).size(), row.to);
+        const std::size_t at = text.find(from, text.find(after));
+        ASSERT_NE(std::string::npos, text.find(after)) << after;
+        ASSERT_NE(std::string::npos, at) << from;
+        text.replace(at, from.size(), to);
         T_MODEL_CONTENT content = before;
         T_FILE_ERROR error;
-        EXPECT_EQ(0, CCaseFile::Parse(text, "f", "", content, error)) << row.to;
-        EXPECT_TRUE(SameContent(before, content)) << row.to;
+        EXPECT_EQ(0, CCaseFile::Parse(text, "f", "", content, error)) << to;
+        EXPECT_TRUE(SameContent(before, content)) << to;
         EXPECT_EQ(FILE_FAULT::BadInput, error.fault) << error.text;
-        if (row.message) {
-            EXPECT_EQ(std::string("f: ") + row.message, error.text);
-        }
+        EXPECT_EQ("f: " + message, error.text);
     }
 }

@@ -1,6 +1,5 @@
 // Construction stages in the case file, in the model file and in a document.
-#include "modelstoresample.h"
-#include "qm_db/casefile.h"
+#include "casetext.h"
 #include "qm_db/dbdoc.h"
 
 #include <cmath>
@@ -13,27 +12,6 @@ const std::string kData = QM_TEST_DATA;
 std::string AllText()
 {
     return BytesOf(kData + "/cases/stage_all_members.json");
-}
-
-int Parse(const std::string& text, T_MODEL_CONTENT& content, T_FILE_ERROR& error)
-{
-    return CCaseFile::Parse(text, "case.json", "", content, error);
-}
-
-T_MODEL_CONTENT ParseGood(const std::string& text)
-{
-    T_MODEL_CONTENT content;
-    T_FILE_ERROR error;
-    EXPECT_EQ(1, Parse(text, content, error)) << error.text;
-    return content;
-}
-
-std::string PrintGood(const T_MODEL_CONTENT& content)
-{
-    std::string text;
-    T_FILE_ERROR error;
-    EXPECT_EQ(1, CCaseFile::Print(content, text, error)) << error.text;
-    return text;
 }
 
 std::string UsersAsText(const T_MODEL& model, const T_RECORD_USERS& users)
@@ -106,47 +84,7 @@ TEST(StageCase, AFileOfVersion3OpensAndTakesStages)
 
 TEST(StageCase, BadInputNamesThePlace)
 {
-    struct T_ROW {
-        const char* after;
-        const char* from;
-        const char* to;
-        const char* message;
-    };
-    // clang-format off
-    const T_ROW rows[] = {
-        {"stage_control", "\"design\"", "\"old\"", "stage_control.birth: unknown birth of elements \"old\"; allowed: deformed, design"},
-        {"stage_control", "cable_sag", "sag", "stage_control: unknown key \"sag\""},
-        {"load_cases", "\"load_group\": 0", "\"load_group\": 3", "load_cases[0].load_group: a load group is 0, 1 or 2"},
-        {"\"stages\"", "\"S2\"", "\"S1\"", "stages[1].name: \"S1\" appears twice"},
-        {"\"stages\"", "[1]", "[9]", "stages[0].activate.elements[0]: there is no such element"},
-        {"\"stages\"", "[1]", "[1, 1]", "stages[0].activate.elements[1]: the element appears twice"},
-        {"\"stages\"", "\"supports\": [1]", "\"supports\": [8]", "stages[0].activate.supports[0]: there is no such node"},
-        {"\"stages\"", "\"case\": \"G\"", "\"case\": \"H\"", "stages[0].activate.loads[0].case: there is no such load case"},
-        {"\"stages\"", "\"case\": \"G\"", "\"case\": \"G\", \"step\": 0", "stages[0].activate.loads[0].step: steps count from 1"},
-        {"\"stages\"", "\"step\": \"last\"", "\"step\": \"end\"", "stages[1].activate.loads[0].step: unknown step \"end\"; allowed: first, last"},
-        {"\"stages\"", "\"steps\": 3", "\"steps\": 0", "stages[1].steps: a stage has at least one step"},
-        {"\"stages\"", "7.5", "-7.5", "stages[1].duration: the value can't be negative"},
-        {"\"stages\"", "\"activate\"", "\"active\"", "stages[0]: unknown key \"active\""},
-        {"ulf_constraints", "\"S3\"", "\"S4\"", "ulf_constraints[0].stage: there is no such stage"},
-        {"ulf_constraints", "\"stage\": \"S2\", ", "", "ulf_constraints[1].step: a step needs a stage"},
-        {"ulf_stage_items", "\"S3\"", "\"S4\"", "ulf_stage_items[0].unknown[0].stage: there is no such stage"},
-        {"ulf_stage_items", "\"T\"", "\"U\"", "ulf_stage_items[0].unknown[0].case: there is no such load case"},
-        {"ulf_stage_items", "\"weight\"", "\"factor\"", "ulf_stage_items[0].unknown[0]: unknown key \"factor\""},
-        {"ulf_stage_items", "\"factor\"", "\"weight\"", "ulf_stage_items[0].known[0]: unknown key \"weight\""},
-        {"ulf_stage_items", "\"load_group\": 1", "\"load_group\": -1", "ulf_stage_items[0].known[0].load_group: a load group is 0, 1 or 2"},
-    };
-    // clang-format on
-    for (const T_ROW& row : rows) {
-        std::string text = AllText();
-        const std::size_t at = text.find(row.from, text.find(row.after));
-        ASSERT_NE(std::string::npos, at) << row.from;
-        text.replace(at, std::string(row.from).size(), row.to);
-        T_MODEL_CONTENT content;
-        T_FILE_ERROR error;
-        EXPECT_EQ(0, Parse(text, content, error)) << row.message;
-        EXPECT_NE(std::string::npos, error.text.find(row.message))
-            << error.text << "\nexpected " << row.message;
-    }
+    ExpectRefused(AllText(), "stage_refusals.txt");
 }
 
 TEST(StageCase, StepsHaveNamesAndARunningNumber)
