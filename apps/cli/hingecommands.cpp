@@ -2,11 +2,11 @@
 #include "hingetools.h"
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+#include "qm_db/recordrules.h"
 #include "qm_db/records/hingenames.h"
 #include "qm_rps/hinge/hingegenerator.h"
 #include "qm_rps/hinge/hingetypefindings.h"
 #include "qm_rps/po_hingetypelistdlg.h"
-#include "qm_rps/po_loadcasedlg.h"
 
 namespace {
 
@@ -128,17 +128,12 @@ EXIT_CODE RunCaseCheck(const std::string& file)
 {
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, file); code != EXIT_CODE::Done) return code;
-    const auto hasFunction = [&](int key) {
-        return doc.Data().Model().incrementFunctions.contains(key);
-    };
     std::size_t findings = 0;
     for (const auto& entry : doc.Data().Model().pushovers) {
         T_POLC_D polc;
         if (!doc.Attr().GetPolc(entry.first, polc)) continue;
-        CPO_LoadCaseDlg dialog(hasFunction);
-        dialog.Data2Dlg(polc);
-        std::vector<T_FINDING> all = dialog.Findings();
-        const auto rows = CPO_LoadCaseDlg::PatternFindings(polc.patterns);
+        std::vector<T_FINDING> all = LoadCaseFindings(polc, doc.Data().Model());
+        const auto rows = PatternFindings(polc.patterns);
         all.insert(all.end(), rows.begin(), rows.end());
         for (const T_FINDING& f : all)
             std::printf("%s: %s: %s\n", polc.name.c_str(), f.field.c_str(), f.text.c_str());

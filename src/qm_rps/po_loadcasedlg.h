@@ -1,11 +1,9 @@
 // Model of the pushover load case dialog: control and stop criteria, and the list of load patterns.
 // Lengths in the caller's units, angles in degrees. With a document it edits one of its load cases
-// and stores it on OK; without one it checks what it is given.
+// and stores it on OK; without one it checks what it is given, as if in an empty model.
 #pragma once
 
 #include "qm_rps/rpsdlgbase.h"
-
-#include <functional>
 
 class CPO_LoadCaseDlg : public CRPSDlgBase {
 public:
@@ -17,11 +15,6 @@ public:
         double mode = 0.0;      // as typed; truncated
         double factor = 1.0;
     };
-
-    /// Works on the document that it is given.
-    CPO_LoadCaseDlg();
-    /// Works without one. Tells whether there is an increment function (T_POFC_D) of this key.
-    explicit CPO_LoadCaseDlg(std::function<bool(int key)> hasIncrementFunction);
 
     /// Takes the document and its first load case, or a new one where it has none.
     void SetDoc(CDBDoc* doc) override;
@@ -59,9 +52,6 @@ public:
     /// (free name, existing node, modes and load cases); CheckData shows the first.
     std::vector<T_FINDING> Findings() const override;
 
-    /// What the row checks say of rows that are already stored.
-    static std::vector<T_FINDING> PatternFindings(const std::vector<T_POLC_PATTERN>& rows);
-
     /// A row from the input. 0 refused with a message. A kind outside 0 to 3 raises the release
     /// assertion and gives a row with its scale factor only (number 0).
     [[nodiscard]] int CheckPattern(const T_PATTERN_INPUT& input, T_POLC_PATTERN& row);
@@ -73,8 +63,7 @@ public:
     /// Chooses a row (-1: none) and takes it as input.
     void SelectPattern(int row);
 
-    // Texts of a pattern row, and of what can be chosen for one.
-    static std::string KindText(int kind);
+    /// What a pattern row names, in words.
     std::string NumberText(const T_POLC_PATTERN& row) const;
     std::vector<std::string> LoadCaseNames() const;
     std::vector<std::string> FunctionNames() const;
@@ -84,7 +73,8 @@ public:
 
 private:
     bool HasSelection() const;
-    void DocFindings(std::vector<T_FINDING>& out) const;
+    /// Shows the first of them. True where there is none.
+    bool IsKept(const std::vector<T_FINDING>& findings);
     bool Store(CEditData& edit, const T_POLC_D& record);
     bool IsAsRead();
     void KeepRead();
@@ -92,6 +82,5 @@ private:
     int m_key = 0;
     T_POLC_D m_read; // in SI, when the case was read
     T_UNITS m_units; // of the document then
-    std::function<bool(int)> m_hasIncrementFunction;
     bool m_patternsEdited = false;
 };

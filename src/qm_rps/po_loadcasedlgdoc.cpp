@@ -1,18 +1,13 @@
 // The load case dialog on a document: which case it edits, what the document asks of it, storing.
 #include "qm_base/msgfunction.h"
-#include "qm_base/ruletable.h"
 #include "qm_rps/po_loadcasedlg.h"
+#include "qm_rps/pushover/loadcasedocrules.h"
 
 #include <algorithm>
 
 using zql::lib::MMSGFunction;
 
 namespace {
-
-constexpr T_RULE_HEAD kNameTaken{.message = "IDS_QM_UI_POLC_NAME_TAKEN", .field = "name"};
-constexpr T_RULE_HEAD kNoNode{.message = "IDS_QM_UI_POLC_NO_NODE", .field = "controlNode"};
-constexpr T_RULE_HEAD kNoResult{.message = "IDS_QM_UI_POLC_NO_RESULT", .field = "controlNode"};
-constexpr T_RULE_HEAD kNoControl{.message = "IDS_QM_UI_POLC_NO_CONTROL", .field = "hasControl"};
 
 // Kinds of pattern rows.
 constexpr int kStatic = 0, kAcceleration = 1;
@@ -90,33 +85,7 @@ int CPO_LoadCaseDlg::NextKey(const CDBDoc& doc)
 
 bool CPO_LoadCaseDlg::HasResults() const
 {
-    return m_key != 0 && Doc() && Doc()->Post().SelectPushover(m_key);
-}
-
-/// What keeps the model whole: its file can be read again, its results are still understood.
-void CPO_LoadCaseDlg::DocFindings(std::vector<T_FINDING>& out) const
-{
-    const T_MODEL& model = Doc()->Data().Model();
-    const auto report = [&](bool wrong, const T_RULE_HEAD& head) {
-        if (wrong) out.push_back(FindingOf(head, {}));
-    };
-    int other = 0;
-    report(Doc()->Attr().FindPolc(m_case.name, other) && other != m_key, kNameTaken);
-    report(!model.nodes.contains(m_case.controlNode), kNoNode);
-    const bool results = HasResults();
-    report(results && !Doc()->Post().ExistNodePost(m_case.controlNode), kNoResult);
-    report(!results && !m_case.control, kNoControl);
-    // A model without modes or load cases of its own names those of another solver.
-    for (std::size_t i = 0; m_patternsEdited && i < m_case.patterns.size(); ++i) {
-        const T_POLC_PATTERN& row = m_case.patterns[i];
-        const std::string field = "patterns[" + std::to_string(i) + "]";
-        const bool isMode = row.kind > kAcceleration;
-        report(isMode && !model.modes.empty() && !model.modes.contains(row.number),
-               {.message = "IDS_QM_UI_POLC_NO_MODE", .field = field.c_str()});
-        report(row.kind == kStatic && !model.loadCases.empty() &&
-                   !model.loadCases.contains(row.number),
-               {.message = "IDS_QM_UI_POLC_NO_CASE", .field = field.c_str()});
-    }
+    return Doc() && HasPushResults(*Doc(), m_key);
 }
 
 bool CPO_LoadCaseDlg::Store(CEditData& edit, const T_POLC_D& record)
@@ -185,15 +154,6 @@ void CPO_LoadCaseDlg::SelectPattern(int row)
 }
 
 // ---- texts --------------------------------------------------------------------------------------
-
-std::string CPO_LoadCaseDlg::KindText(int kind)
-{
-    static constexpr std::array<const char*, 4> kKeys{
-        "IDS_PUSHOVER_Static_Load_Cases", "IDS_PUSHOVER_Uniform_Acceleration",
-        "IDS_PUSHOVER_Mode_Shape", "IDS_PUSHOVER_Mode_Shape_Story_Mass"};
-    const auto at = static_cast<std::size_t>(kind);
-    return at < kKeys.size() ? MMSGFunction::GetValue(kKeys[at]) : std::string();
-}
 
 std::string CPO_LoadCaseDlg::NumberText(const T_POLC_PATTERN& row) const
 {

@@ -479,10 +479,3 @@ int CPushOverCurveDlg::ExistEC8() const
     Assert(__LINE__);
     return 0;
 }
-
-const char* MethodName(PUSH_METHOD method)
-{
-    static constexpr std::array<const char*, 5> kNames{"FEMA440", "ATC-40", "EC8/OPCM", "NTC2008",
-                                                       "NTC2018"};
-    return kNames[static_cast<std::size_t>(method) - 4];
-}

@@ -17,9 +17,6 @@ struct T_PUSH_SHOW {
     bool operator==(const T_PUSH_SHOW&) const = default;
 };
 
-/// Structural behaviour of ATC-40 with the person's own points of kappa.
-inline constexpr int kUserBehavior = 3;
-
 class CPushOverCurveEdit : public zql::frx::MDialog {
 public:
     /// Starts with the document's first evaluation, or a new one. The document must outlive this.

@@ -198,20 +198,6 @@ TEST_F(LoadCaseWindows, TheListAddsCopiesAndDeletes)
     EXPECT_EQ(nullptr, CModelessDlgCtrl::Of(m_main->Doc()).Find(IDD_PO_LOADCASE_LIST));
 }
 
-TEST_F(LoadCaseWindows, AUsedLoadCaseIsNotDeletedAndItsUsersAreNamed)
-{
-    ASSERT_TRUE(Open("rc-frame-3-storey"));
-    Run("IDS_QM_UI_POLC_LIST");
-    CDialogWindow* list = Window("Pushover load cases");
-    ASSERT_NE(nullptr, list);
-    EXPECT_FALSE(Field(*list, "IDS_QM_UI_POLC_DELETE")->isEnabled()); // none is chosen
-    Table(*list, "rows").setCurrentIndex(Table(*list, "rows").Model().index(1, 0));
-    CAnswers answers({CAnswers::Accept()});
-    Click(Field(*list, "IDS_QM_UI_POLC_DELETE"));
-    EXPECT_TRUE(answers.m_texts.value(0).contains("PX_UNIFORM ATC-40 A"));
-    EXPECT_EQ(2U, Model().pushovers.size());
-}
-
 TEST_F(LoadCaseWindows, TheSelectionGivesTheChosenCase)
 {
     ASSERT_TRUE(Open("rc-frame-3-storey"));
@@ -293,16 +279,4 @@ TEST_F(LoadCaseWindows, TheAxialTableIsEditedThroughTheService)
     EXPECT_EQ(150.0, rows[1].axial);
     EXPECT_EQ(80.0, rows[1].sides.pos.yield); // from the nearest one
     EXPECT_EQ(75.5, rows[2].sides.neg.yield);
-}
-
-TEST_F(LoadCaseWindows, AnOpenWindowStoresNothingInAnotherModel)
-{
-    ASSERT_TRUE(Open("hinge-library"));
-    CDialogWindow* window = OpenItem(0);
-    ASSERT_NE(nullptr, window);
-    ASSERT_TRUE(Open("space-frame-3d")); // without pushover load cases
-    CAnswers answers({CAnswers::Accept()});
-    window->accept();
-    EXPECT_TRUE(answers.m_texts.value(0).contains("not in the model any more"));
-    EXPECT_TRUE(Model().pushovers.empty());
 }

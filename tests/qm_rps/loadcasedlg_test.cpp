@@ -1,4 +1,5 @@
 #include "qm_base/appbase.h"
+#include "qm_db/recordrules.h"
 #include "qm_rps/po_loadcasedlg.h"
 
 #include <gtest/gtest.h>
@@ -6,7 +7,6 @@
 
 namespace {
 
-using P = T_POLC_D;
 constexpr double kNan = std::numeric_limits<double>::quiet_NaN();
 constexpr const char* kName = "IDS_PUSHOVER_Error___Loadcase_name_is_not_input_";
 constexpr const char* kFunction = "IDS_RPS_PO_Error_No_Increment_Function";
@@ -19,70 +19,78 @@ constexpr const char* kMode = "IDS_PUSHOVER_Error___Mode_must_be_greater_than_0"
 constexpr const char* kFirst = "IDS_PUSHOVER_The_Load_Pattern_of_Mode_Shape_can_hav";
 constexpr const char* kExists = "IDS_PUSHOVER_Error___The_data_already_exist_";
 
-P ByForce()
+using P = T_POLC_D;
+using C = T_POLC_CONTROL;
+
+/// Controlled by a force that follows no function; by the displacement of the control node, or by
+/// the largest one.
+enum START { kForce, kMasterNode, kAnyNode };
+
+P Start(START start)
 {
     P p;
     p.name = "PX";
-    p.control = T_POLC_CONTROL();
-    p.control->incrementMethod = 2;
-    return p;
-}
-
-P ByDispl(bool master)
-{
-    P p = ByForce();
-    p.control->incrementMethod = 1;
-    p.control->masterNodeControl = master;
-    p.control->masterMaxDispl = master ? 0.3 : 0;
-    p.control->maxTransDispl = master ? 0 : 0.3;
+    C& c = p.control.emplace();
+    c.incrementMethod = start == kForce ? 2 : 1;
+    c.masterNodeControl = start == kMasterNode;
+    if (start == kMasterNode) c.masterMaxDispl = 0.3;
+    if (start == kAnyNode) c.maxTransDispl = 0.3;
     return p;
 }
 
 struct T_CASE {
-    const char* key;
-    P start;
-    void (*spoil)(P&);
+    std::vector<std::string> keys; // in the order of the check
+    START start;
+    void (*spoil)(P&, C&);
 };
 // clang-format off
 const T_CASE kCases[] = { // function 4 exists
-    { "", ByDispl(true), [](P&) {} },
-    { "", ByDispl(false), [](P&) {} },
-    { kName, ByForce(), [](P& p) { p.name = ""; p.control->stiffnessRatioLimit = -1; } },
-    { kName, ByForce(), [](P& p) { p.name = ""; p.control.reset(); } },
-    { "", ByForce(), [](P& p) { p.control.reset(); } },
-    { kFunction, ByForce(), [](P& p) { p.control->incrementOption = 2; p.control->incrementFunction = 5; p.control->stiffnessRatioLimit = -1; } },
-    { "", ByForce(), [](P& p) { p.control->incrementOption = 2; p.control->incrementFunction = 4; } },
-    { kRatio, ByForce(), [](P& p) { p.control->stiffnessRatioLimit = -0.01; p.control->generateStaticAngle = true; } },
-    { kRatio, ByForce(), [](P& p) { p.control->stiffnessRatioLimit = kNan; } },
-    { kAngle, ByForce(), [](P& p) { p.control->generateStaticAngle = true; } },
-    { "", ByForce(), [](P& p) { p.control->generateStaticAngle = true; p.control->staticAngle = 1e-9; } },
-    { kMaster, ByDispl(true), [](P& p) { p.control->masterMaxDispl = 0; } },
-    { "", ByDispl(true), [](P& p) { p.control->masterMaxDispl = -0.05; p.control->stiffnessRatioLimit = -1; } },
-    { kTrans, ByDispl(false), [](P& p) { p.control->maxTransDispl = 0; } },
-    { kTrans, ByDispl(false), [](P& p) { p.control->maxTransDispl = -0.05; } },
+    { {}, kMasterNode, [](P&, C& c) { c.masterMaxDispl = -0.05; c.stiffnessRatioLimit = -1; } },
+    { {}, kAnyNode, [](P&, C&) {} },
+    { {kName, kRatio}, kForce, [](P& p, C& c) { p.name = ""; c.stiffnessRatioLimit = -0.01; } },
+    { {kName}, kForce, [](P& p, C&) { p.name = ""; p.control.reset(); } },
+    { {kFunction}, kForce, [](P&, C& c) { c.incrementOption = 2; c.incrementFunction = 5; } },
+    { {}, kForce, [](P&, C& c) { c.incrementOption = 2; c.incrementFunction = 4; } },
+    { {}, kForce, [](P&, C& c) { c.incrementOption = 1; c.incrementFunction = 5; } },
+    { {kRatio}, kForce, [](P&, C& c) { c.stiffnessRatioLimit = kNan; } },
+    { {kAngle}, kForce, [](P&, C& c) { c.generateStaticAngle = true; } },
+    { {}, kForce, [](P&, C& c) { c.generateStaticAngle = true; c.staticAngle = 1e-9; } },
+    { {kMaster}, kMasterNode, [](P&, C& c) { c.masterMaxDispl = 0; } },
+    { {kTrans}, kAnyNode, [](P&, C& c) { c.maxTransDispl = 0; } },
+    { {kTrans}, kAnyNode, [](P&, C& c) { c.maxTransDispl = -0.05; } },
 };
 // clang-format on
 
-bool Exists(int key)
+std::vector<std::string> Keys(const std::vector<T_FINDING>& findings)
 {
-    return key == 4;
+    std::vector<std::string> keys;
+    for (const T_FINDING& f : findings)
+        keys.push_back(f.messageKey);
+    return keys;
 }
 
-TEST(LoadCase, ReportsEachRuleInOrderAndWritesNothing)
+} // namespace
+
+TEST(LoadCase, FindsEachRuleThatIsNotKept)
 {
+    T_MODEL model;
+    model.incrementFunctions[4] = {};
     for (const T_CASE& c : kCases) {
-        P p = c.start;
-        c.spoil(p);
-        CPO_LoadCaseDlg dlg(Exists);
-        dlg.Data2Dlg(p);
-        P stored;
-        stored.name = "before";
-        const P before = stored;
-        EXPECT_EQ(*c.key ? 0 : 1, dlg.Dlg2Data(stored)) << "row " << &c - kCases;
-        EXPECT_EQ(c.key, dlg.Messages().empty() ? "" : dlg.Messages().front().key)
-            << "row " << &c - kCases;
-        EXPECT_TRUE(!*c.key || before == stored) << "row " << &c - kCases;
+        P p = Start(c.start);
+        c.spoil(p, *p.control);
+        EXPECT_EQ(c.keys, Keys(LoadCaseFindings(p, model))) << "row " << &c - kCases;
     }
+}
+
+TEST(LoadCase, ARefusedCaseIsNotWritten)
+{
+    CPO_LoadCaseDlg dlg;
+    dlg.Data2Dlg(Start(kAnyNode));
+    dlg.m_case.name = "";
+    P stored = Start(kForce);
+    EXPECT_EQ(0, dlg.Dlg2Data(stored));
+    EXPECT_EQ(Start(kForce), stored);
+    EXPECT_EQ(kName, dlg.Messages().at(0).key);
 }
 
 TEST(LoadCase, ChecksPatternRows)
@@ -99,30 +107,25 @@ TEST(LoadCase, ChecksPatternRows)
         {{0, 7, 2, 0, kNan}, 0, kFactor},
     };
     for (const auto& row : rows) {
-        CPO_LoadCaseDlg dlg(Exists);
-        T_POLC_PATTERN out{9, 9, 9};
+        CPO_LoadCaseDlg dlg;
+        const T_POLC_PATTERN before{9, 9, 9};
+        T_POLC_PATTERN out = before;
         EXPECT_EQ(row.number ? 1 : 0, dlg.CheckPattern(row.in, out));
         EXPECT_EQ(row.key, dlg.Messages().empty() ? "" : dlg.Messages().front().key);
-        const T_POLC_PATTERN untouched{9, 9, 9};
-        EXPECT_EQ(row.number ? (T_POLC_PATTERN{row.in.kind, row.number, row.in.factor}) : untouched,
+        EXPECT_EQ(row.number ? (T_POLC_PATTERN{row.in.kind, row.number, row.in.factor}) : before,
                   out);
     }
-}
-
-TEST(LoadCase, AssertsOnAnUnknownPatternKindAndKeepsItsFactor)
-{
-    CPO_LoadCaseDlg dlg(Exists);
     T_POLC_PATTERN out;
     CAppBase::TakeAssertions_ST();
-    EXPECT_EQ(1, dlg.CheckPattern({4, 7, 2, 5, 1.5}, out));
+    EXPECT_EQ(1, CPO_LoadCaseDlg().CheckPattern({4, 7, 2, 5, 1.5}, out)); // no such kind
     EXPECT_EQ((T_POLC_PATTERN{4, 0, 1.5}), out);
     EXPECT_EQ("src/qm_rps/po_loadcasedlg", CAppBase::TakeAssertions_ST().at(0).source);
 }
 
 TEST(LoadCase, AddsPatternsByTheirNumberAlone)
 {
-    CPO_LoadCaseDlg dlg(Exists);
-    dlg.Data2Dlg(ByForce());
+    CPO_LoadCaseDlg dlg;
+    dlg.Data2Dlg(Start(kForce));
     EXPECT_EQ(1, dlg.OnAddPattern({0, 1, 0, 0, 1}));
     EXPECT_EQ(0, dlg.OnAddPattern({1, 0, 0, 0, 1})); // direction 1 collides with load case 1
     EXPECT_EQ(kExists, dlg.Messages().back().key);
@@ -138,16 +141,11 @@ TEST(LoadCase, AddsPatternsByTheirNumberAlone)
 
 TEST(LoadCase, FindsWhatStoredPatternsBreak)
 {
-    const auto found =
-        CPO_LoadCaseDlg::PatternFindings({{0, 1, 0}, {2, 0, 1}, {1, 1, 1}, {1, 2, 1}});
-    const char* keys[] = {kFactor, kMode, kFirst, kExists};
+    const std::vector<T_POLC_PATTERN> rows{{0, 1, 0}, {2, 0, 1}, {1, 1, 1}, {1, 2, 1}};
+    const auto found = PatternFindings(rows);
+    EXPECT_EQ((std::vector<std::string>{kFactor, kMode, kFirst, kExists}), Keys(found));
     const char* fields[] = {"patterns[0]", "patterns[1]", "patterns[1]", "patterns[2]"};
-    ASSERT_EQ(4u, found.size());
-    for (std::size_t i = 0; i < 4; ++i) {
-        EXPECT_EQ(keys[i], found[i].messageKey);
+    for (std::size_t i = 0; i < found.size(); ++i)
         EXPECT_EQ(fields[i], found[i].field);
-    }
-    EXPECT_TRUE(CPO_LoadCaseDlg::PatternFindings({{2, 1, 1}, {0, 3, 1}}).empty());
+    EXPECT_TRUE(PatternFindings(std::vector<T_POLC_PATTERN>{{2, 1, 1}, {0, 3, 1}}).empty());
 }
-
-} // namespace

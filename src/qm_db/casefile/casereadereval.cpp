@@ -1,17 +1,10 @@
 #include "qm_db/casefile/casereader.h"
 #include "qm_db/casefile/jsonnames.h"
+#include "qm_db/records/evaluationrules.h"
 
 #include <algorithm>
 
 namespace {
-
-/// Number of procedures of a method: the first ones of A, B, C. The target-displacement methods
-/// have none.
-std::size_t ProcedureCount(PUSH_METHOD method)
-{
-    if (method == PUSH_METHOD::Atc40) return 2;
-    return method == PUSH_METHOD::Fema440 ? 3 : 0;
-}
 
 template <class T>
 bool HasName(const T_TABLE<T>& table, const std::string& name)
@@ -20,49 +13,37 @@ bool HasName(const T_TABLE<T>& table, const std::string& name)
                        [&](const auto& entry) { return entry.second.name == name; });
 }
 
-auto IsBetween(int low, int high)
+/// A fault of the member where it breaks a rule of evaluations.
+void Judge(CJsonReader& in, std::string_view key, const T_EVAL_D& eval)
 {
-    return [low, high](int v) { return v >= low && v <= high; };
+    if (const char* const reason = EvaluationFault(eval, key)) in.FailAt(key, reason);
+}
+
+template <class T>
+void GetJudged(CJsonReader& in, std::string_view key, std::optional<T>& out, const T_EVAL_D& eval)
+{
+    in.Get(key, out);
+    Judge(in, key, eval);
 }
 
 void ReadProcedure(CJsonReader& in, T_EVAL_D& eval)
 {
     if (!in.Has("procedure")) return;
-    const std::size_t count = ProcedureCount(eval.method);
-    if (count == 0) return in.FailAt("procedure", "only ATC-40 and FEMA440 have procedures");
-    eval.procedure = *kProcedures[static_cast<std::size_t>(
-        in.Choice("procedure", std::span(kProcedures).first(count), "procedure"))];
+    const auto offered = ProceduresOf(eval.method);
+    if (offered.empty()) return in.FailAt("procedure", "only ATC-40 and FEMA440 have procedures");
+    eval.procedure =
+        *offered[static_cast<std::size_t>(in.Choice("procedure", offered, "procedure"))];
 }
 
-void ReadDamping(CJsonReader& in, T_EVAL_D& eval)
+void ReadBilinear(CJsonReader in, T_EVAL_D& eval)
 {
-    in.Get("behavior", eval.behavior);
-    in.CheckIf("behavior", eval.behavior, IsBetween(0, 3), "the behavior is 0, 1, 2 or 3");
-    in.Get("elastic_damping", eval.elasticDamping);
-    in.CheckIf(
-        "elastic_damping", eval.elasticDamping, [](double d) { return d >= 0.0 && d <= 100.0; },
-        "damping is 0 to 100 per cent");
-    in.Get("user_damping", eval.userDamping);
-    in.CheckIf(
-        "user_damping", eval.userDamping,
-        [](const std::array<double, 4>& p) { return p[0] > 0.0 && p[2] > 0.0; },
-        "both beta must be above 0");
-    in.CheckIf(
-        "user_damping", eval.userDamping,
-        [](const std::array<double, 4>& p) { return p[0] <= p[2]; }, "beta2 is below beta1");
-}
-
-void ReadBilinear(CJsonReader in, T_EVAL_BILINEAR& bilinear)
-{
-    const auto isFraction = [](double v) { return v > 0.0 && v <= 1.0; };
+    T_EVAL_BILINEAR& bilinear = eval.bilinear.emplace();
     in.Keys({"rule", "secant", "drop", "iterate"});
     if (in.Has("rule"))
         bilinear.rule = kBilinearRules[static_cast<std::size_t>(
             in.Choice("rule", kBilinearRules, "bilinear rule"))];
-    in.Get("secant", bilinear.secant);
-    in.CheckIf("secant", bilinear.secant, isFraction, "the fraction is above 0 and up to 1");
-    in.Get("drop", bilinear.drop);
-    in.CheckIf("drop", bilinear.drop, isFraction, "the fraction is above 0 and up to 1");
+    GetJudged(in, "secant", bilinear.secant, eval);
+    GetJudged(in, "drop", bilinear.drop, eval);
     in.Get("iterate", bilinear.iterate);
 }
 
@@ -87,15 +68,15 @@ void ReadEvaluation(CJsonReader& in, int key, T_MODEL& model, std::set<std::stri
     eval.method =
         static_cast<PUSH_METHOD>(kFirstMethod + in.Choice("method", kMethodNames, "method"));
     ReadProcedure(in, eval);
-    ReadDamping(in, eval);
+    GetJudged(in, "behavior", eval.behavior, eval);
+    GetJudged(in, "elastic_damping", eval.elasticDamping, eval);
+    GetJudged(in, "user_damping", eval.userDamping, eval);
     in.Get("eigen_factors", eval.eigenFactors);
     in.Get("masonry", eval.masonry);
-    in.Get("drift_kind", eval.driftKind);
-    in.CheckIf("drift_kind", eval.driftKind, IsBetween(1, 2), "the drift kind is 1 or 2");
-    in.Get("plot_type", eval.plotType);
-    in.CheckIf("plot_type", eval.plotType, IsBetween(0, 8), "the plot type is 0 to 8");
+    GetJudged(in, "drift_kind", eval.driftKind, eval);
+    GetJudged(in, "plot_type", eval.plotType, eval);
     in.Get("alpha_in_percent", eval.alphaInPercent);
-    if (in.Has("bilinear")) ReadBilinear(in.Member("bilinear"), eval.bilinear.emplace());
+    if (in.Has("bilinear")) ReadBilinear(in.Member("bilinear"), eval);
     model.evaluations[key] = std::move(eval);
 }
 

@@ -1,10 +1,10 @@
 // Tables of loads, stages, pushover evaluation, hinges and unknown load factors.
 #include "qm_base/msgfunction.h"
+#include "qm_db/recordrules.h"
 #include "qm_rps/desk/recordtable.h"
 #include "qm_rps/desk/recordtables.h"
 #include "qm_rps/factors/ulftexts.h"
 #include "qm_rps/hinge/hingelabels.h"
-#include "qm_rps/pushover/pushevaluation.h"
 
 namespace {
 

@@ -18,5 +18,7 @@ struct T_LOADCASE_ROW {
 
 /// Every pushover load case, keys ascending.
 std::vector<T_LOADCASE_ROW> LoadCaseRows(const CDBDoc& doc);
+/// Kind of a load pattern in words, 0 to 3; "" of another.
+std::string PatternKindText(int kind);
 /// Index of the row with that key; -1: none.
 int RowOfLoadCase(const std::vector<T_LOADCASE_ROW>& rows, int key);

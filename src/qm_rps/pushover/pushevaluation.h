@@ -4,6 +4,7 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
+#include "qm_db/recordrules.h"
 #include "qm_rps/pushover/pushovercurvedata.h"
 #include "qm_rps/pushover/pushovertargetdisp.h"
 
@@ -91,6 +92,3 @@ struct T_PUSH_EVALUATION {
         return eval.method == PUSH_METHOD::Ec8Opcm && eval.masonry.value_or(false);
     }
 };
-
-/// "ATC-40", "FEMA440", "EC8/OPCM", "NTC2008", "NTC2018".
-const char* MethodName(PUSH_METHOD method);

@@ -1,6 +1,7 @@
 #include "qm_ui/loadcase/loadcaseview.h"
 
 #include "qm_base/textformat.h"
+#include "qm_db/recordrules.h"
 #include "qm_rps/dialog/unithead.h"
 #include "qm_rps/po_loadcasedlg.h"
 #include "qm_rps/po_loadcaselistdlg.h"
@@ -159,7 +160,7 @@ void BuildGeneral(CFormView& form, D& d)
 std::string RowFault(const D& d, std::size_t row)
 {
     const std::string field = "patterns[" + std::to_string(row) + "]";
-    for (const auto& all : {d.Findings(), D::PatternFindings(d.m_case.patterns)})
+    for (const auto& all : {d.Findings(), PatternFindings(d.m_case.patterns)})
         for (const T_FINDING& f : all)
             if (f.field == field) return f.text;
     return {};
@@ -174,7 +175,7 @@ T_GRID_BINDING PatternGrid(D& d)
     grid.rows = [&d] { return d.m_case.patterns.size(); };
     grid.text = [&d](std::size_t r, std::size_t c) {
         const T_POLC_PATTERN& row = d.m_case.patterns.at(r);
-        return c == 0   ? D::KindText(row.kind)
+        return c == 0   ? PatternKindText(row.kind)
                : c == 1 ? d.NumberText(row)
                         : ShortestText(row.factor);
     };
@@ -191,8 +192,8 @@ void BuildPatternInput(CFormView& form, D& d)
     };
     form.Choice(KeyText("IDS_QM_UI_POLC_KIND"), Ref(d.m_input.kind),
                 [] {
-                    return std::vector<std::string>{D::KindText(0), D::KindText(1), D::KindText(2),
-                                                    D::KindText(3)};
+                    return std::vector<std::string>{PatternKindText(0), PatternKindText(1),
+                                                    PatternKindText(2), PatternKindText(3)};
                 })
         .name = "input.kind";
     CFormField& load = form.Choice(KeyText("IDS_QM_UI_POLC_LOAD"),

@@ -1,0 +1,130 @@
+#include "qm_db/records/loadcaserules.h"
+
+#include "qm_base/msgfunction.h"
+#include "qm_db/records/rulehead.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace {
+
+constexpr int kDisplacementControl = 1;
+constexpr int kFollowsFunction = 2;
+constexpr const char* kAngle = "IDS_PUSHOVER_STATIC_ANGLE_GEN";
+
+// ---- control and stop criteria ------------------------------------------------------------------
+
+struct T_CHECK {
+    const T_POLC_D& record;
+    const T_POLC_CONTROL& c;
+    const T_MODEL& model;
+};
+using C = T_CHECK;
+
+bool ByForce(const C& c)
+{
+    return c.record.control && c.c.incrementMethod != kDisplacementControl;
+}
+bool ByDispl(const C& c)
+{
+    return c.record.control && c.c.incrementMethod == kDisplacementControl;
+}
+bool IsAbove0(double v)
+{
+    return std::isfinite(v) && v > 0.0;
+}
+
+constexpr T_RECORD_RULE<C> kRules[] = {
+    {{.message = "IDS_PUSHOVER_Error___Loadcase_name_is_not_input_", .field = "name"},
+     [](const C& c) { return !c.record.name.empty(); }},
+    {{.message = "IDS_RPS_PO_Error_No_Increment_Function", .field = "control.incrementFunction"},
+     [](const C& c) { return c.model.incrementFunctions.contains(c.c.incrementFunction); },
+     [](const C& c) { return ByForce(c) && c.c.incrementOption == kFollowsFunction; }},
+    {{.message = "IDS_RPS_PO_POLC_Current_Stif_Ratio_0", .field = "control.stiffnessRatioLimit"},
+     [](const C& c) {
+         return std::isfinite(c.c.stiffnessRatioLimit) && c.c.stiffnessRatioLimit >= 0.0;
+     },
+     ByForce},
+    {{.message = kAngle, .field = "control.staticAngle"},
+     [](const C& c) { return IsAbove0(c.c.staticAngle); },
+     [](const C& c) { return ByForce(c) && c.c.generateStaticAngle; }},
+    // exactly 0 alone is refused: the sign gives the direction of the push
+    {{.message = "IDS_PUSHOVER_Error___Master_Max_Displ__must_be_grea",
+      .field = "control.masterMaxDispl"},
+     [](const C& c) { return std::isfinite(c.c.masterMaxDispl) && c.c.masterMaxDispl != 0.0; },
+     [](const C& c) { return ByDispl(c) && c.c.masterNodeControl; }},
+    {{.message = "IDS_PUSHOVER_Error___Max__Translational_Displ__must",
+      .field = "control.maxTransDispl"},
+     [](const C& c) { return IsAbove0(c.c.maxTransDispl); },
+     [](const C& c) { return ByDispl(c) && !c.c.masterNodeControl; }},
+};
+
+// ---- pattern rows -------------------------------------------------------------------------------
+
+constexpr T_RECORD_RULE<T_POLC_PATTERN> kRowRules[] = {
+    {{.message = "IDS_PUSHOVER_the_Scale_Factor_can_not_be_zero"},
+     [](const T_POLC_PATTERN& r) { return std::isfinite(r.factor) && r.factor != 0.0; }},
+    {{.message = "IDS_PUSHOVER_Error___Mode_must_be_greater_than_0"},
+     [](const T_POLC_PATTERN& r) { return r.number > 0; },
+     [](const T_POLC_PATTERN& r) { return IsModePattern(r.kind); }},
+};
+
+struct T_ROW_PLACE {
+    const T_POLC_PATTERN& row;
+    std::span<const T_POLC_PATTERN> before;
+};
+constexpr T_RECORD_RULE<T_ROW_PLACE> kPlaceRules[] = {
+    {{.message = "IDS_PUSHOVER_The_Load_Pattern_of_Mode_Shape_can_hav"},
+     [](const T_ROW_PLACE& p) { return p.before.empty(); },
+     [](const T_ROW_PLACE& p) { return IsModePattern(p.row.kind); }},
+    // The number alone counts, whatever the kinds of the rows: this is meant.
+    {{.message = "IDS_PUSHOVER_Error___The_data_already_exist_"},
+     [](const T_ROW_PLACE& p) {
+         return std::ranges::none_of(
+             p.before, [&](const T_POLC_PATTERN& r) { return r.number == p.row.number; });
+     }},
+};
+
+} // namespace
+
+std::vector<T_FINDING> LoadCaseFindings(const T_POLC_D& record, const T_MODEL& model)
+{
+    const T_POLC_CONTROL none;
+    std::vector<T_FINDING> out;
+    WalkRules(kRules, {record, record.control ? *record.control : none, model}, {}, out);
+    for (T_FINDING& f : out)
+        if (f.messageKey == kAngle) f.ruleText = f.text += " >0"; // "%s >0"
+    return out;
+}
+
+std::vector<T_FINDING> PatternRowFindings(const T_POLC_PATTERN& row, const std::string& prefix)
+{
+    std::vector<T_FINDING> out;
+    WalkRules(kRowRules, row, {.prefix = prefix}, out);
+    return out;
+}
+
+std::vector<T_FINDING> PatternPlaceFindings(const T_POLC_PATTERN& row,
+                                            std::span<const T_POLC_PATTERN> before,
+                                            const std::string& prefix)
+{
+    std::vector<T_FINDING> out;
+    WalkRules(kPlaceRules, {row, before}, {.prefix = prefix}, out);
+    return out;
+}
+
+std::vector<T_FINDING> PatternFindings(std::span<const T_POLC_PATTERN> rows)
+{
+    std::vector<T_FINDING> out;
+    for (std::size_t i = 0; i < rows.size(); ++i) {
+        for (const auto& found : {PatternRowFindings(rows[i], PatternField(i)),
+                                  PatternPlaceFindings(rows[i], rows.first(i), PatternField(i))})
+            out.insert(out.end(), found.begin(), found.end());
+    }
+    return out;
+}
+
+std::string PatternField(std::size_t row)
+{
+    return "patterns[" + std::to_string(row) + "]";
+}
