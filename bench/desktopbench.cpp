@@ -34,7 +34,7 @@ public:
         QApplication::processEvents();
         m_plot = dynamic_cast<CPlotWidget*>(m_window->Form().Find("plot")->widget);
     }
-    bool IsReady() const { return m_plot && m_edit->Refusal().empty(); }
+    bool IsReady() const { return m_plot && m_edit->Shown().Refusal().empty(); }
 
     /// Draws what is on show anew.
     void Repaint()
@@ -55,7 +55,8 @@ public:
     {
         m_edit->m_settings.name = m_edit->m_settings.name == "A" ? "B" : "A";
         m_edit->Update();
-        T_PLOT plot = PushoverCurvePlot(m_edit->Pictured(), m_edit->m_show, m_edit->Trial());
+        T_PLOT plot =
+            PushoverCurvePlot(m_edit->Shown().Pictured(), m_edit->m_show, m_edit->Shown().Trial());
         plot.notes.clear(); // as in the window
         m_plot->UpdatePlot(std::move(plot));
         m_plot->repaint();

@@ -1,5 +1,6 @@
 // Cost of the model file and of many evaluations in one process.
 #include "qm_db/casefile.h"
+#include "qm_rps/pushovercalculators.h"
 #include "qm_rps/pushovercurvedlg.h"
 #include "ratios.h"
 
@@ -125,10 +126,11 @@ void EvaluateByKernel(benchmark::State& state)
     CDBDoc doc;
     T_FILE_ERROR error;
     if (!doc.ImportCase(kCase, error)) state.SkipWithError(error.text.c_str());
-    CPushOverCurveDlg driver(doc);
+    CPushEvaluator driver(doc, RunPerfPtProcedure);
     T_EVAL_D eval;
+    T_FINDING refusal;
     (void)doc.Attr().GetEval(1, eval);
-    (void)driver.SetEvaluation(eval);
+    (void)driver.SetEvaluation(eval, refusal);
     driver.Evaluate();
     T_SPFC_D spectrum;
     int key = 0;

@@ -5,6 +5,7 @@
 #include "qm_db/filectrl.h"
 #include "qm_rps/pushover/pushovercomparison.h"
 #include "qm_rps/pushover/pushoverreport.h"
+#include "qm_rps/pushovercalculators.h"
 #include "qm_rps/pushovercurvedlg.h"
 #include "resulttable.h"
 #include "say.h"
@@ -25,10 +26,7 @@ namespace {
 bool AddExtras(CPushOverCurveDlg& driver, const T_EVALUATE_OPTIONS& options)
 {
     const auto refused = [&](const std::string& what) {
-        const auto& messages = driver.Messages();
-        Complain(EXIT_CODE::Usage,
-                 what + ": " +
-                     (messages.empty() ? Say("IDS_QM_CLI_NOT_POSSIBLE") : messages.back().text));
+        Complain(EXIT_CODE::Usage, what + ": " + driver.Refusal().text);
         return false;
     };
     for (const int step : options.steps) {
@@ -55,7 +53,7 @@ EXIT_CODE EvaluateAll(CDBDoc& doc, const T_EVALUATE_OPTIONS& options,
         if (!driver.SetEvaluation(eval))
             return Complain(EXIT_CODE::BadInput,
                             doc.Path() + ": " + Say("IDS_QM_CLI_EVALUATION_QUOTED", eval.name) +
-                                ": " + driver.SettingsError());
+                                ": " + driver.Refusal().text);
         driver.Evaluate();
         if (!AddExtras(driver, options)) return EXIT_CODE::Usage;
         out.push_back(driver.Result());
@@ -128,9 +126,10 @@ EXIT_CODE RunCompare(const T_COMPARE_OPTIONS& o)
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     T_PUSH_COMPARISON comparison;
-    std::string error;
-    if (!ComparePushover(doc, o.push, o.spectrum, o.behavior, comparison, error))
-        return Complain(EXIT_CODE::Usage, o.file + ": " + error);
+    CPushEvaluator evaluator(doc, RunPerfPtProcedure);
+    T_FINDING refusal;
+    if (!ComparePushover(evaluator, o.push, o.spectrum, o.behavior, comparison, refusal))
+        return Complain(EXIT_CODE::Usage, o.file + ": " + refusal.text);
     EXIT_CODE code = EXIT_CODE::Done;
     if (!o.json.empty()) code = WriteOutput(o.json, ResultJson(comparison.results));
 #ifdef QM_UI

@@ -22,7 +22,7 @@ T_WINDOW_EXAMPLE CurveExample(const char* name, const char* evaluation, int tria
     return {name, "rc-frame-3-storey", [=](CMainWindow& main) -> std::unique_ptr<QWidget> {
                 auto window = CPushOverWindow::Make(main.Desktop(), nullptr);
                 if (!window->Model().OnOpen(evaluation)) return nullptr;
-                window->Model().SetTrial(trial);
+                window->Model().Shown().SetTrial(trial);
                 window->Form().Refresh();
                 window->show();
                 window->resize(1280, 860);
@@ -116,7 +116,7 @@ std::vector<T_WINDOW_EXAMPLE> PushoverWindowExamples()
     };
     const auto damping = [](CDBDoc&) {
         auto model = std::make_unique<CPushOverCurveDampParamUser>();
-        model->Data2Dlg({3, 5.0, 10.0, 0.9, 40.0, 0.4});
+        model->Data2Dlg({10.0, 0.9, 40.0, 0.4});
         return model;
     };
     return {CurveExample("pushover-atc40", "PX_MODE1 ATC-40 A", 2),

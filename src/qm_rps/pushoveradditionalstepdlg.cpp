@@ -1,31 +1,19 @@
 #include "qm_rps/pushoveradditionalstepdlg.h"
 
-#include "qm_base/msgfunction.h"
+#include "qm_rps/pushover/pushevaluator.h"
+#include "qm_rps/pushover/refusal.h"
 
 #include <algorithm>
 
-int CPushOverAdditionalStepDlg::AddStep(int step)
+int CPushOverAdditionalStepDlg::AddStep(int step, T_FINDING& refusal)
 {
-    if (m_steps.size() >= kMaxAdditional) {
-        ShowMessage("IDS_RPS_PUSHOVER_Maxnum_reached");
-        return 0;
-    }
-    if (step < 1 || step > m_stepCount) {
-        ShowMessage(
-            "IDS_QM_NO_SUCH_STEP",
-            zql::lib::MMSGFunction::Format("IDS_QM_NO_SUCH_STEP",
-                                           {std::to_string(step), std::to_string(m_stepCount)}));
-        return 0;
-    }
-    if (std::ranges::find(m_steps, step) != m_steps.end()) {
-        ShowMessage("IDS_PUSHOVER_Error___The_data_already_exist_");
-        return 0;
-    }
+    if (m_steps.size() >= kMaxAdditional)
+        return Refuse(refusal, "step", "IDS_RPS_PUSHOVER_Maxnum_reached");
+    if (step < 1 || step > m_stepCount)
+        return Refuse(refusal, "step", "IDS_QM_NO_SUCH_STEP",
+                      {std::to_string(step), std::to_string(m_stepCount)});
+    if (std::ranges::find(m_steps, step) != m_steps.end())
+        return Refuse(refusal, "step", "IDS_PUSHOVER_Error___The_data_already_exist_");
     m_steps.push_back(step);
     return 1;
-}
-
-int CPushOverAdditionalStepDlg::RemoveStep(int step)
-{
-    return std::erase(m_steps, step) > 0 ? 1 : 0;
 }

@@ -2,12 +2,10 @@
 // drawn beside the result. At most 10.
 #pragma once
 
+#include "qm_base/finding.h"
 #include "qm_base/mdialog.h"
 
 #include <vector>
-
-/// Most additional steps, and most additional performance points, that are kept.
-inline constexpr std::size_t kMaxAdditional = 10;
 
 class CPushOverAdditionalStepDlg : public zql::frx::MDialog {
 public:
@@ -17,9 +15,7 @@ public:
 
     /// 1 added; 0 the list is full (IDS_RPS_PUSHOVER_Maxnum_reached), the step does not exist
     /// (IDS_QM_NO_SUCH_STEP) or is listed already (IDS_PUSHOVER_Error___The_data_already_exist_).
-    [[nodiscard]] int AddStep(int step);
-    /// 1 removed; 0 it was not listed.
-    [[nodiscard]] int RemoveStep(int step);
+    [[nodiscard]] int AddStep(int step, T_FINDING& refusal);
     void Clear() { m_steps.clear(); }
 
 private:

@@ -3,6 +3,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/desk/recordnames.h"
+#include "qm_rps/pushovercalculators.h"
 
 using zql::lib::MMSGFunction;
 
@@ -26,7 +27,12 @@ int CPushOverComparisonDlg::Update()
                                                         : "IDS_QM_UI_PUSH_NO_SPECTRUM");
         return 0;
     }
-    return ComparePushover(m_doc, m_push, m_spectrum, m_behavior, m_comparison, m_error);
+    CPushEvaluator evaluator(m_doc, RunPerfPtProcedure);
+    T_FINDING refusal;
+    const int done =
+        ComparePushover(evaluator, m_push, m_spectrum, m_behavior, m_comparison, refusal);
+    m_error = refusal.text;
+    return done;
 }
 
 T_TEXT_TABLE CPushOverComparisonDlg::Cells() const

@@ -4,6 +4,8 @@
 #include "qm_rps/dialog/texttable.h"
 #include "qm_rps/pushover/pushovercomparison.h"
 
+#include <functional>
+
 class CPushOverComparisonDlg : public zql::frx::MDialog {
 public:
     /// The document must outlive the dialog.

@@ -1,24 +1,21 @@
 #include "qm_rps/pushovercurvedampparamuser.h"
 
+#include "qm_db/recordrules.h"
 #include "qm_rps/pushover/adrsformulas.h"
 
 #include <algorithm>
-#include <cmath>
 
-void CPushOverCurveDampParamUser::Data2Dlg(const T_DAMP_PARAM& damping)
+void CPushOverCurveDampParamUser::Data2Dlg(const std::array<double, 4>& points)
 {
-    m_beta1 = damping.beta1;
-    m_kappa1 = damping.kappa1;
-    m_beta2 = damping.beta2;
-    m_kappa2 = damping.kappa2;
+    m_beta1 = points[0];
+    m_kappa1 = points[1];
+    m_beta2 = points[2];
+    m_kappa2 = points[3];
 }
 
-void CPushOverCurveDampParamUser::Dlg2Data(T_DAMP_PARAM& damping) const
+void CPushOverCurveDampParamUser::Dlg2Data(std::array<double, 4>& points) const
 {
-    damping.beta1 = m_beta1;
-    damping.kappa1 = m_kappa1;
-    damping.beta2 = m_beta2;
-    damping.kappa2 = m_kappa2;
+    points = {m_beta1, m_kappa1, m_beta2, m_kappa2};
 }
 
 std::vector<T_POINT2> CPushOverCurveDampParamUser::Curve() const
@@ -31,9 +28,10 @@ std::vector<T_POINT2> CPushOverCurveDampParamUser::Curve() const
 
 int CPushOverCurveDampParamUser::CheckData()
 {
-    const bool finite =
-        std::isfinite(m_beta2) && std::isfinite(m_kappa1) && std::isfinite(m_kappa2);
-    if (finite && m_beta1 <= m_beta2 && m_beta1 > 0.0 && m_beta2 > 0.0) return 1;
-    ShowMessage("IDS_PUSHOVER_Wrong_Input_");
+    T_EVAL_D evaluation; // its other options are absent, which is in order
+    Dlg2Data(evaluation.userDamping.emplace());
+    const std::vector<T_FINDING> found = OptionFindings(evaluation);
+    if (found.empty()) return 1;
+    ShowMessage(found.front().messageKey, found.front().text);
     return 0;
 }

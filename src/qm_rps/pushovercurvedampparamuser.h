@@ -2,16 +2,19 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_rps/pushover/pushoverperfptrecord.h"
+#include "qm_db/mathfunc.h"
+
+#include <array>
+#include <vector>
 
 class CPushOverCurveDampParamUser : public zql::frx::MDialog {
 public:
     /// Fields in their order on the dialog: damping in per cent, factors without unit.
     double m_beta1 = 0.0, m_kappa1 = 0.0, m_beta2 = 0.0, m_kappa2 = 0.0;
 
-    void Data2Dlg(const T_DAMP_PARAM& damping);
-    /// Writes the four values into the settings.
-    void Dlg2Data(T_DAMP_PARAM& damping) const;
+    /// beta1, kappa1, beta2, kappa2, as evaluations keep them.
+    void Data2Dlg(const std::array<double, 4>& points);
+    void Dlg2Data(std::array<double, 4>& points) const;
 
     /// Kappa over the hysteretic damping, for a picture: level to beta1, straight to beta2, level
     /// beyond, up to the damping of a rectangular loop (63.7 per cent) or beta2.

@@ -1,31 +1,45 @@
 #include "qm_rps/pushovercurvesub1dlg.h"
 
 #include "qm_base/msgfunction.h"
-#include "qm_rps/pushover/pushevaluation.h"
+#include "qm_db/recordrules.h"
+#include "qm_rps/desk/recordnames.h"
+#include "qm_rps/pushover/pushovercurvedata.h"
 
-namespace {
+using zql::lib::MMSGFunction;
 
-constexpr std::array<const char*, 3> kProcedureKeys{
-    "IDS_RPS_PO_PROC_TYPE_A", "IDS_RPS_PO_PROC_TYPE_B", "IDS_RPS_PO_PROC_TYPE_C"};
-
-} // namespace
-
-std::span<const char* const> CPushOverCurveSub1Dlg::Procedures(PUSH_METHOD method)
+std::vector<std::string> CPushOverCurveSub1Dlg::LoadCases() const
 {
-    const std::span<const char* const> all(kProcedureKeys);
-    if (method == PUSH_METHOD::Fema440) return all;
-    return method == PUSH_METHOD::Atc40 ? all.first(2) : all.first(0);
+    return NamesOf(m_doc.Data().Model().pushovers);
 }
 
-int CPushOverCurveSub1Dlg::CheckData()
+std::vector<std::string> CPushOverCurveSub1Dlg::Methods()
 {
-    const auto offered = Procedures(m_method).size();
-    const auto index = static_cast<std::size_t>(m_procedure - 'A');
-    // A target displacement has no procedure: A stands for its only way.
-    if (index < (offered == 0 ? 1 : offered)) return 1;
-    ShowMessage(
-        "IDS_QM_NO_SUCH_PROCEDURE",
-        zql::lib::MMSGFunction::Format("IDS_QM_NO_SUCH_PROCEDURE",
-                                       {MethodName(m_method), std::string(1, m_procedure)}));
-    return 0;
+    return {kMethodNames.begin(), kMethodNames.end()};
+}
+
+std::vector<std::string> CPushOverCurveSub1Dlg::Procedures() const
+{
+    constexpr std::array kKeys{"IDS_RPS_PO_PROC_TYPE_A", "IDS_RPS_PO_PROC_TYPE_B",
+                               "IDS_RPS_PO_PROC_TYPE_C"};
+    return TextsOf(std::span(kKeys).first(ProceduresOf(m_settings.method).size()));
+}
+
+std::vector<std::string> CPushOverCurveSub1Dlg::PlotTypes()
+{
+    constexpr std::array kKeys{"IDS_QM_UI_PUSH_PLOT_REACTION", "IDS_QM_UI_PUSH_PLOT_SHEAR",
+                               "IDS_QM_UI_PUSH_PLOT_DRIFT", "IDS_QM_UI_PUSH_PLOT_FACTOR"};
+    std::vector<std::string> texts = TextsOf(kKeys);
+    for (const char* const method : kMethodNames)
+        texts.push_back(MMSGFunction::Format("IDS_QM_UI_PUSH_PLOT_SPECTRUM", {method}));
+    return texts;
+}
+
+void CPushOverCurveSub1Dlg::ChangeMethod(PUSH_METHOD method)
+{
+    if (method == m_settings.method) return;
+    if (m_settings.plotType && IsSpectral(static_cast<PLOT_TYPE>(*m_settings.plotType)))
+        m_settings.plotType.reset();
+    m_settings.method = method;
+    const auto index = static_cast<std::size_t>(m_settings.procedure.value_or('A') - 'A');
+    if (index >= ProceduresOf(method).size()) m_settings.procedure.reset();
 }

@@ -1,25 +1,28 @@
-// Page of the pushover curve window with the choice of method and procedure.
+// Page of the pushover curve window with the choice of load case, method, procedure and plot. It
+// edits the evaluation of its window.
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_db/records.h"
-
-#include <span>
+#include "qm_db/dbdoc.h"
 
 class CPushOverCurveSub1Dlg : public zql::frx::MDialog {
 public:
-    /// The two lists of methods, in the order of the page.
-    static constexpr std::array<PUSH_METHOD, 2> kPerfPointMethods{PUSH_METHOD::Fema440,
-                                                                  PUSH_METHOD::Atc40};
-    static constexpr std::array<PUSH_METHOD, 3> kTargetMethods{
-        PUSH_METHOD::Ec8Opcm, PUSH_METHOD::Ntc2008, PUSH_METHOD::Ntc2018};
+    /// Document and evaluation must outlive the page.
+    CPushOverCurveSub1Dlg(const CDBDoc& doc, T_EVAL_D& settings) : m_doc(doc), m_settings(settings)
+    {
+    }
 
-    PUSH_METHOD m_method = PUSH_METHOD::Atc40;
-    char m_procedure = 'A';
+    std::vector<std::string> LoadCases() const;
+    /// Names of the methods, FEMA 440 first, in the order of their codes.
+    static std::vector<std::string> Methods();
+    std::vector<std::string> Procedures() const; // none for target displacements
+    static std::vector<std::string> PlotTypes(); // by code 0 to 8
+    bool IsTarget() const { return m_settings.method >= PUSH_METHOD::Ec8Opcm; }
 
-    /// Keys of the procedures that a method offers, A first; none for target displacements.
-    static std::span<const char* const> Procedures(PUSH_METHOD method);
+    /// Another method: the procedure becomes one that it offers, the plot its own.
+    void ChangeMethod(PUSH_METHOD method);
 
-    /// The procedure is one that the method offers. 0 shows IDS_QM_NO_SUCH_PROCEDURE.
-    int CheckData() override;
+private:
+    const CDBDoc& m_doc;
+    T_EVAL_D& m_settings;
 };

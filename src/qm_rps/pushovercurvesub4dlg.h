@@ -1,4 +1,5 @@
-// Page of the pushover curve window with the options of the bilinear capacity spectrum.
+// Page of the pushover curve window with the options of the bilinear capacity spectrum. It edits
+// the evaluation of its window.
 #pragma once
 
 #include "qm_base/mdialog.h"
@@ -11,15 +12,14 @@ public:
         "IDS_RPS_PO_MODEL_BILINEAR", "IDS_RPS_PO_MODEL_STIFF", "IDS_RPS_PO_MODEL_STRNTH",
         "IDS_RPS_PO_MODEL_CAPACITY"};
 
-    /// As edited; absent values take the rule's defaults.
-    T_EVAL_BILINEAR m_options;
+    /// The evaluation must outlive the page.
+    explicit CPushOverCurveSub4Dlg(T_EVAL_D& settings) : m_settings(settings) {}
 
-    void Data2Dlg(const std::optional<T_EVAL_BILINEAR>& options)
-    {
-        m_options = options.value_or(T_EVAL_BILINEAR{});
-    }
+    /// The options in the settings; made on the first call. Absent values take the rule's defaults.
+    T_EVAL_BILINEAR& Options();
+    /// Options that say nothing leave the settings.
+    void DropEmpty();
 
-    /// The secant fraction and the ultimate drop lie in (0, 1]. 0 shows
-    /// IDS_DB_PO_CURVE_PP_BETWEEN_0_1 and the page stays open.
-    int CheckData() override;
+private:
+    T_EVAL_D& m_settings;
 };

@@ -1,6 +1,6 @@
 #include "qm_rps/ssreportinforw.h"
 
-#include "qm_rps/pushovercurvedlg.h"
+#include "qm_rps/pushovercalculators.h"
 
 namespace {
 
@@ -77,13 +77,14 @@ int AddPushovers(CDBDoc& doc, SSReportInfoRW& out, std::string& error)
 
 int AddEvaluations(CDBDoc& doc, SSReportInfoRW& out, std::string& error)
 {
-    CPushOverCurveDlg driver(doc);
+    CPushEvaluator driver(doc, RunPerfPtProcedure);
+    T_FINDING refusal;
     driver.SetStoreSteps(false); // a report changes nothing
     for (const auto& entry : doc.Data().Model().evaluations) {
         T_EVAL_D eval;
         if (!doc.Attr().GetEval(entry.first, eval)) continue;
-        if (!driver.SetEvaluation(eval)) {
-            error = "evaluation \"" + eval.name + "\": " + driver.SettingsError();
+        if (!driver.SetEvaluation(eval, refusal)) {
+            error = "evaluation \"" + eval.name + "\": " + refusal.text;
             return 0;
         }
         driver.Evaluate();
@@ -100,7 +101,7 @@ int BuildReportInfo(CDBDoc& doc, SSReportInfoRW& out, std::string& error)
     T_STYP_D styp;
     if (doc.Attr().GetStyp(styp)) info.title = styp.title;
     info.units = doc.Unit().Units();
-    info.gravity = CPushOverCurveDlg(doc).GetGravity(0);
+    info.gravity = CPushEvaluator(doc, RunPerfPtProcedure).FindGravity(false);
     AddStoreys(doc, info);
     if (!AddPushovers(doc, info, error) || !AddEvaluations(doc, info, error)) return 0;
     out = std::move(info);

@@ -116,7 +116,7 @@ TEST_F(PushoverWindows, TheWholeJobGivesTheReportOfTheCommandLine)
         const auto it = std::ranges::find(names, job.stored);
         ASSERT_NE(names.end(), it);
         ChooseIndex(Field("open"), static_cast<int>(it - names.begin()) + 1);
-        ASSERT_EQ(job.stored, Model().Result().eval.name);
+        ASSERT_EQ(job.stored, Model().Shown().Result().eval.name);
         ChooseIndex(Field("spectrum"), job.spectrum);
         AnswerFileName(File("window")); // .txt is appended
         {
@@ -128,7 +128,7 @@ TEST_F(PushoverWindows, TheWholeJobGivesTheReportOfTheCommandLine)
         const QByteArray report = Contents(File("window.txt"));
         EXPECT_GT(report.size(), 1000) << job.same;
         EXPECT_EQ(Contents(File("program.txt")), report) << job.same;
-        const T_PUSH_EVALUATION& e = Model().Result();
+        const T_PUSH_EVALUATION& e = Model().Shown().Result();
         EXPECT_EQ(NumberAfter(json, "\"factors\"", "gamma"), e.factors.gamma);
         if (e.IsTarget()) {
             EXPECT_EQ(NumberAfter(json, "\"limit_states\"", "demand"), e.limitStates[0].demand);
@@ -145,23 +145,23 @@ TEST_F(PushoverWindows, TheWholeJobGivesTheReportOfTheCommandLine)
 TEST_F(PushoverWindows, TypingIsEvaluatedAtOnceAndWrongInputKeepsTheLastPicture)
 {
     OpenCurve();
-    const double first = Model().Result().point->Sd;
+    const double first = Model().Shown().Result().point->Sd;
     Type(Field("elasticDamping"), "8");
-    const double softer = Model().Result().point->Sd;
+    const double softer = Model().Shown().Result().point->Sd;
     EXPECT_LT(softer, first);
-    EXPECT_EQ("", Model().Refusal());
+    EXPECT_EQ("", Model().Shown().Refusal());
     const T_PLOT before = Plot().Plot();
     for (const char* wrong : {"-1", "101", "x", ""}) {
         Type(Field("elasticDamping"), wrong);
         EXPECT_TRUE(IsMarked("elasticDamping")) << wrong;
         EXPECT_EQ(before, Plot().Plot()) << wrong;
-        EXPECT_EQ(softer, Model().Result().point->Sd) << wrong;
+        EXPECT_EQ(softer, Model().Shown().Result().point->Sd) << wrong;
     }
     Type(Field("elasticDamping"), "-1");
     EXPECT_TRUE(Field("refusal")->isVisible());
     EXPECT_TRUE(Refusal().contains("0 to 100"));
     Type(Field("elasticDamping"), "5");
-    EXPECT_EQ(first, Model().Result().point->Sd);
+    EXPECT_EQ(first, Model().Shown().Result().point->Sd);
     EXPECT_FALSE(Field("refusal")->isVisible());
     EXPECT_FALSE(IsMarked("elasticDamping"));
 }
@@ -169,23 +169,23 @@ TEST_F(PushoverWindows, TypingIsEvaluatedAtOnceAndWrongInputKeepsTheLastPicture)
 TEST_F(PushoverWindows, TrialsAreSteppedThroughOneAtATime)
 {
     OpenCurve();
-    const int count = Model().TrialCount();
+    const int count = Model().Shown().TrialCount();
     ASSERT_EQ(2, count);
     auto* slider = Field("trial")->findChild<QSlider*>();
     ASSERT_EQ(count, slider->maximum());
     Plot().SetView({T_PLOT_RANGE{0.0, 5.0}, {}, {}}); // the person has zoomed in
     for (int k = 1; k <= count; ++k) {
         Key(slider, Qt::Key_Right);
-        EXPECT_EQ(k, Model().Trial());
+        EXPECT_EQ(k, Model().Shown().Trial());
         EXPECT_TRUE(HasLabel(("trial " + std::to_string(k)).c_str()));
         EXPECT_EQ(5.0, Plot().View().x->hi);
         auto* table = qobject_cast<QTableView*>(Field("trials"));
         EXPECT_EQ(k - 1, table->currentIndex().row());
     }
     Key(Field("trial")->findChild<QSpinBox*>(), Qt::Key_Down);
-    EXPECT_EQ(count - 1, Model().Trial());
+    EXPECT_EQ(count - 1, Model().Shown().Trial());
     auto* table = qobject_cast<QTableView*>(Field("trials"));
-    const double dpi = Model().Result().trace[0].dpi;
+    const double dpi = Model().Shown().Result().trace[0].dpi;
     EXPECT_NEAR(dpi, table->model()->index(0, 0).data().toDouble(), 1e-5 * dpi);
 }
 
@@ -206,7 +206,7 @@ TEST_F(PushoverWindows, EveryMethodAndPlotTypeHasItsPicture)
     for (int type = 0; type < 4; ++type) {
         ChooseIndex(Field("plotType"), type);
         EXPECT_EQ(titles[type], Plot().Plot().y.title);
-        EXPECT_EQ(Model().Result().curve.x, Plot().Plot().series.at(0).x);
+        EXPECT_EQ(Model().Shown().Result().curve.x, Plot().Plot().series.at(0).x);
     }
     ChooseIndex(Field("method"), 1);
     EXPECT_TRUE(Field("procedure")->isVisibleTo(m_window));
@@ -269,7 +269,7 @@ TEST_F(PushoverWindows, UserDampingIsAcceptedRefusedAndCancelled)
     EXPECT_EQ(10.0, (*Model().m_settings.userDamping)[0]);
     EXPECT_EQ(30.0, (*Model().m_settings.userDamping)[2]);
     EXPECT_EQ(Model().m_settings.userDamping,
-              Model().Result().eval.userDamping); // evaluated with them
+              Model().Shown().Result().eval.userDamping); // evaluated with them
 }
 
 TEST_F(PushoverWindows, StoredEvaluationsAndStepsAreVisibleActions)
@@ -302,7 +302,7 @@ TEST_F(PushoverWindows, AdditionalStepsAndPointsAreListedAndDrawn)
         Type(Field("addStepNumber"), step);
         Click(Field("addStep"));
     }
-    EXPECT_EQ(2U, Model().Result().additionalSteps.size());
+    EXPECT_EQ(2U, Model().Shown().Result().additionalSteps.size());
     EXPECT_TRUE(HasLabel("step 40"));
     Type(Field("addStepNumber"), "100000");
     {
@@ -312,12 +312,12 @@ TEST_F(PushoverWindows, AdditionalStepsAndPointsAreListedAndDrawn)
     }
     ChooseIndex(Field("addPointSpectrum"), 1);
     Click(Field("addPoint"));
-    EXPECT_EQ(1U, Model().Result().additionalPoints.size());
-    EXPECT_TRUE(HasLabel("ATC strong") || !Model().Result().additionalPoints[0].point);
+    EXPECT_EQ(1U, Model().Shown().Result().additionalPoints.size());
+    EXPECT_TRUE(HasLabel("ATC strong") || !Model().Shown().Result().additionalPoints[0].point);
     qobject_cast<QTableView*>(Field("steps"))->selectRow(0);
     Click(Field("removeStep"));
-    ASSERT_EQ(1U, Model().Result().additionalSteps.size());
-    EXPECT_EQ(40, Model().Result().additionalSteps[0].step);
+    ASSERT_EQ(1U, Model().Shown().Result().additionalSteps.size());
+    EXPECT_EQ(40, Model().Shown().Result().additionalSteps[0].step);
 }
 
 TEST_F(PushoverWindows, TheComparisonShowsEveryMethodAndIsExported)
@@ -345,7 +345,7 @@ TEST_F(PushoverWindows, OneWindowFollowsTheDocumentAndTheLanguage)
     ASSERT_TRUE(OpenPushoverRecord(m_main->Desktop(), EXPLORER_TABLE::Evaluations, 6));
     m_window = &CPushOverWindow::Show(m_main->Desktop());
     EXPECT_EQ(m_window, &CPushOverWindow::Show(m_main->Desktop()));
-    EXPECT_EQ("PX_MODE1 EC8", Model().Result().eval.name);
+    EXPECT_EQ("PX_MODE1 EC8", Model().Shown().Result().eval.name);
     Run("IDS_QM_UI_ITALIAN");
     EXPECT_EQ("Curva pushover", m_window->windowTitle());
     EXPECT_TRUE(QString::fromStdString(Plot().Plot().x.title).startsWith("Spostamento spettrale"));
@@ -353,7 +353,7 @@ TEST_F(PushoverWindows, OneWindowFollowsTheDocumentAndTheLanguage)
     ASSERT_TRUE(Open("first-steps"));
     (void)CPushOverWindow::Show(m_main->Desktop());
     const auto& pushes = m_main->Doc().Data().Model().pushovers;
-    EXPECT_EQ(pushes.begin()->second.name, Model().Result().loadCase.name);
+    EXPECT_EQ(pushes.begin()->second.name, Model().Shown().Result().loadCase.name);
     EXPECT_FALSE(OpenPushoverRecord(m_main->Desktop(), EXPLORER_TABLE::Nodes, 1));
     // Enter takes a value and closes nothing.
     auto* damping = qobject_cast<QLineEdit*>(Field("elasticDamping"));

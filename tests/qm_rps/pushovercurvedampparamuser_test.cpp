@@ -24,14 +24,12 @@ TEST(CurveDampParamUser, AcceptsAscendingPositiveDampingAndRefusesTheRest)
     };
     for (const T_CASE& c : cases) {
         CPushOverCurveDampParamUser dlg;
-        const T_DAMP_PARAM in{2, 3.0, c.beta1, c.kappa1, c.beta2, c.kappa2};
+        const std::array<double, 4> in{c.beta1, c.kappa1, c.beta2, c.kappa2};
         dlg.Data2Dlg(in);
         if (c.accepted) {
-            T_DAMP_PARAM out{1, 4.0, 0, 0, 0, 0};
+            std::array<double, 4> out{};
             dlg.Dlg2Data(out);
-            const std::vector<double> kept{1.0, 4.0, c.beta1, c.kappa1, c.beta2, c.kappa2};
-            EXPECT_EQ(kept, (std::vector<double>{1.0 * out.behaviorType, out.elasticPct, out.beta1,
-                                                 out.kappa1, out.beta2, out.kappa2}));
+            EXPECT_EQ(in, out) << c.label;
         }
         EXPECT_EQ(c.accepted, dlg.OnOK()) << c.label;
         ASSERT_EQ(c.accepted ? 0u : 1u, dlg.Messages().size()) << c.label;

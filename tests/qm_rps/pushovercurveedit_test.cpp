@@ -1,7 +1,9 @@
 #include "qm_rps/pushovercurveedit.h"
 
 #include "pushsample.h"
+#include "qm_rps/pushover/pushovercells.h"
 #include "qm_rps/pushovercurvedampparamuser.h"
+#include "scriptview.h"
 
 #include <algorithm>
 #include <gtest/gtest.h>
@@ -38,18 +40,6 @@ struct T_EDIT {
     }
 };
 
-/// Answers every question alike and takes the messages.
-class CSays : public zql::frx::IDialogView {
-public:
-    explicit CSays(bool yes) : m_yes(yes) {}
-    void ShowMessage(const std::string&, const std::string&) override {}
-    bool AskYesNo(const std::string&, const std::string&) override { return m_yes; }
-    int RunModal(zql::frx::MDialog&) override { return 0; }
-
-private:
-    bool m_yes;
-};
-
 const double kNan = std::numeric_limits<double>::quiet_NaN();
 
 } // namespace
@@ -59,57 +49,56 @@ TEST(PushOverCurveEdit, StartsWithDefaultsThatEvaluate)
     T_EDIT edit;
     EXPECT_EQ("PX", edit->m_settings.push);
     EXPECT_EQ("U", edit->m_settings.spectrum);
-    ASSERT_TRUE(edit->Result().point);
+    ASSERT_TRUE(edit->Shown().Result().point);
     // ATC-40 (8-9) at 5 per cent gives (3.21 - 0.68 ln 5)/2.12 of 0.2 g
-    EXPECT_NEAR(0.2 * (3.21 - 0.68 * std::log(5.0)) / 2.12, edit->Result().point->Sa, 1e-12);
-    EXPECT_EQ("", edit->Refusal());
+    EXPECT_NEAR(0.2 * (3.21 - 0.68 * std::log(5.0)) / 2.12, edit->Shown().Result().point->Sa,
+                1e-12);
+    EXPECT_EQ("", edit->Shown().Refusal());
     EXPECT_FALSE(edit.doc.Data().IsModified());
 }
 
 // Settings that break a rule are refused at their field; the result on show stays.
 TEST(PushOverCurveEdit, RefusedSettingsKeepTheLastResultAndNameTheField)
 {
+    using E = T_EVAL_D;
     struct T_BAD {
         const char* field;
-        void (*spoil)(T_EVAL_D&);
+        void (*spoil)(E&);
     };
+    // clang-format off
     const T_BAD bad[] = {
-        {"push", [](T_EVAL_D& e) { e.push = "gone"; }},
-        {"spectrum", [](T_EVAL_D& e) { e.spectrum = ""; }},
-        {"procedure", [](T_EVAL_D& e) { e.procedure = 'C'; }},
-        {"elasticDamping", [](T_EVAL_D& e) { e.elasticDamping = -1.0; }},
-        {"elasticDamping", [](T_EVAL_D& e) { e.elasticDamping = 100.1; }},
-        {"elasticDamping", [](T_EVAL_D& e) { e.elasticDamping = kNan; }},
-        {"userDamping",
-         [](T_EVAL_D& e) {
-             e.userDamping = {40, 0.9, 30, 0.5};
-         }},
-        {"bilinear.secant",
-         [](T_EVAL_D& e) {
-             e.bilinear = T_EVAL_BILINEAR{{}, 0.0, 0.85, {}};
-         }},
-        {"bilinear.drop",
-         [](T_EVAL_D& e) {
-             e.bilinear = T_EVAL_BILINEAR{{}, 0.6, 1.01, {}};
-         }},
+        {"push",            [](E& e) { e.push = "gone"; }},
+        {"spectrum",        [](E& e) { e.spectrum = ""; }},
+        {"procedure",       [](E& e) { e.procedure = 'C'; }},
+        {"behavior",        [](E& e) { e.behavior = 4; }},
+        {"elasticDamping",  [](E& e) { e.elasticDamping = -1.0; }},
+        {"elasticDamping",  [](E& e) { e.elasticDamping = 100.1; }},
+        {"elasticDamping",  [](E& e) { e.elasticDamping = kNan; }},
+        {"userDamping",     [](E& e) { e.userDamping = {40, 0.9, 30, 0.5}; }},
+        {"driftKind",       [](E& e) { e.driftKind = 3; }},
+        {"plotType",        [](E& e) { e.plotType = -1; }},
+        {"bilinear.secant", [](E& e) { e.bilinear = T_EVAL_BILINEAR{{}, 0.0, 0.85, {}}; }},
+        {"bilinear.drop",   [](E& e) { e.bilinear = T_EVAL_BILINEAR{{}, 0.6, 1.01, {}}; }},
     };
+    // clang-format on
     T_EDIT edit;
     const T_EVAL_D good = edit->m_settings;
-    const double before = edit->Result().point->Sd;
+    const double before = edit->Shown().Result().point->Sd;
     for (const T_BAD& b : bad) {
         edit->m_settings = good;
         b.spoil(edit->m_settings);
         edit->OnEdited();
         ASSERT_EQ(1U, edit->Findings().size()) << b.field;
         EXPECT_EQ(b.field, edit->Findings()[0].field);
-        EXPECT_NE(std::string::npos, edit->Refusal().find(edit->Findings()[0].text)) << b.field;
-        EXPECT_EQ(before, edit->Pictured().point->Sd) << b.field;
+        EXPECT_NE(std::string::npos, edit->Shown().Refusal().find(edit->Findings()[0].text))
+            << b.field;
+        EXPECT_EQ(before, edit->Shown().Pictured().point->Sd) << b.field;
         EXPECT_EQ(0, edit->OnStore()) << b.field;
     }
     edit->m_settings = good;
     edit->OnEdited();
     EXPECT_TRUE(edit->Findings().empty());
-    EXPECT_EQ("", edit->Refusal());
+    EXPECT_EQ("", edit->Shown().Refusal());
 }
 
 TEST(PushOverCurveEdit, ACurveWithoutSpectrumKeepsTheLastPictureButNotItsValues)
@@ -119,30 +108,30 @@ TEST(PushOverCurveEdit, ACurveWithoutSpectrumKeepsTheLastPictureButNotItsValues)
     T_EDIT edit(c);
     edit->m_settings.push = "P0";
     edit->OnEdited();
-    EXPECT_FALSE(edit->Result().point);
-    EXPECT_EQ("PX", edit->Pictured().eval.push);
-    EXPECT_NE("", edit->Refusal());
-    EXPECT_EQ("-", PushoverResultCells(edit->Result()).rows.at(1).at(1));
+    EXPECT_FALSE(edit->Shown().Result().point);
+    EXPECT_EQ("PX", edit->Shown().Pictured().eval.push);
+    EXPECT_NE("", edit->Shown().Refusal());
+    EXPECT_EQ("-", PushoverResultCells(edit->Shown().Result()).rows.at(1).at(1));
 }
 
 TEST(PushOverCurveEdit, AnotherMethodTakesAProcedureAndPlotThatItHas)
 {
     T_EDIT edit;
-    edit->ChangeMethod(PUSH_METHOD::Fema440);
+    edit->m_methodPage.ChangeMethod(PUSH_METHOD::Fema440);
     edit->m_settings.procedure = 'C';
     edit->m_settings.plotType = 4;
-    edit->ChangeMethod(PUSH_METHOD::Atc40);
+    edit->m_methodPage.ChangeMethod(PUSH_METHOD::Atc40);
     EXPECT_EQ(std::nullopt, edit->m_settings.procedure);
     EXPECT_EQ(std::nullopt, edit->m_settings.plotType);
     edit->m_settings.procedure = 'B';
     edit->m_settings.plotType = 2; // not of a method
-    edit->ChangeMethod(PUSH_METHOD::Fema440);
+    edit->m_methodPage.ChangeMethod(PUSH_METHOD::Fema440);
     EXPECT_EQ('B', edit->m_settings.procedure);
-    edit->ChangeMethod(PUSH_METHOD::Ec8Opcm);
+    edit->m_methodPage.ChangeMethod(PUSH_METHOD::Ec8Opcm);
     EXPECT_EQ(std::nullopt, edit->m_settings.procedure);
     EXPECT_EQ(2, edit->m_settings.plotType);
     edit->OnEdited();
-    EXPECT_EQ("", edit->Refusal());
+    EXPECT_EQ("", edit->Shown().Refusal());
 }
 
 TEST(PushOverCurveEdit, StoringIsOneUndoableEditAndAsksBeforeItReplaces)
@@ -155,11 +144,11 @@ TEST(PushOverCurveEdit, StoringIsOneUndoableEditAndAsksBeforeItReplaces)
     EXPECT_EQ(edit->m_settings, edit.doc.Data().Model().evaluations.at(1));
     edit->m_settings.elasticDamping = 3.0;
     EXPECT_EQ(0, edit->OnStore()); // nobody to say yes
-    CSays yes(true), no(false);
-    edit->SetView(&no);
-    EXPECT_EQ(0, edit->OnStore());
+    CScriptView view;
+    edit->SetView(&view);
+    EXPECT_EQ(0, edit->OnStore()); // the answer is no
     EXPECT_EQ(4.0, edit.doc.Data().Model().evaluations.at(1).elasticDamping);
-    edit->SetView(&yes);
+    view.m_yes = true;
     EXPECT_EQ(1, edit->OnStore());
     EXPECT_EQ(3.0, edit.doc.Data().Model().evaluations.at(1).elasticDamping);
     EXPECT_EQ(1, edit.doc.Undo().Undo());
@@ -176,9 +165,9 @@ TEST(PushOverCurveEdit, StepsAreStoredOnRequestOnly)
     T_EDIT edit;
     EXPECT_EQ(0, edit->OnStoreSteps()); // ATC-40 has none
     EXPECT_TRUE(edit.Said("IDS_QM_UI_PUSH_NO_STEPS"));
-    edit->ChangeMethod(PUSH_METHOD::Ec8Opcm);
+    edit->m_methodPage.ChangeMethod(PUSH_METHOD::Ec8Opcm);
     edit->OnEdited();
-    EXPECT_EQ(1, edit->Result().result);
+    EXPECT_EQ(1, edit->Shown().Result().result);
     EXPECT_FALSE(edit.HasSteps());
     EXPECT_FALSE(edit.doc.Data().IsModified());
     EXPECT_EQ(1, edit->OnStoreSteps());
@@ -199,15 +188,16 @@ TEST(PushOverCurveEdit, AdditionalStepsAndPointsComeAgainWithEachEvaluation)
     EXPECT_EQ(1, edit->OnAddPoint());
     edit->m_settings.elasticDamping = 6.0;
     edit->OnEdited();
-    ASSERT_EQ(2U, edit->Result().additionalSteps.size());
-    EXPECT_NEAR(0.06, edit->Result().additionalSteps[0].D, 1e-12);
-    ASSERT_EQ(1U, edit->Result().additionalPoints.size());
-    EXPECT_NEAR(edit->Result().point->Sa / 2, edit->Result().additionalPoints[0].point->Sa, 1e-9);
+    ASSERT_EQ(2U, edit->Shown().Result().additionalSteps.size());
+    EXPECT_NEAR(0.06, edit->Shown().Result().additionalSteps[0].D, 1e-12);
+    ASSERT_EQ(1U, edit->Shown().Result().additionalPoints.size());
+    EXPECT_NEAR(edit->Shown().Result().point->Sa / 2,
+                edit->Shown().Result().additionalPoints[0].point->Sa, 1e-9);
     edit->OnRemoveStep(0);
-    ASSERT_EQ(1U, edit->Result().additionalSteps.size());
-    EXPECT_EQ(4, edit->Result().additionalSteps[0].step);
+    ASSERT_EQ(1U, edit->Shown().Result().additionalSteps.size());
+    EXPECT_EQ(4, edit->Shown().Result().additionalSteps[0].step);
     edit->OnRemovePoint(0);
-    EXPECT_TRUE(edit->Result().additionalPoints.empty());
+    EXPECT_TRUE(edit->Shown().Result().additionalPoints.empty());
 }
 
 TEST(PushOverCurveEdit, TheDocumentIsFollowedWhenItChanges)
@@ -217,9 +207,9 @@ TEST(PushOverCurveEdit, TheDocumentIsFollowedWhenItChanges)
     ASSERT_EQ(1, edit.doc.Edit().Begin("spectrum"));
     ASSERT_EQ(1, edit.doc.Edit().Put(1, T_SPFC_D{"U", T_SPFC_USER{{0, 4}, {0.1, 0.1}, {}}}));
     ASSERT_EQ(1, edit.doc.Edit().Commit());
-    const double before = edit->Result().point->Sa;
+    const double before = edit->Shown().Result().point->Sa;
     EXPECT_EQ(1, edit->OnDocumentChanged());
-    EXPECT_NEAR(before / 2, edit->Result().point->Sa, 1e-12);
+    EXPECT_NEAR(before / 2, edit->Shown().Result().point->Sa, 1e-12);
     T_MODEL_CONTENT other = Plastic();
     other.model.pushovers[1].name = "PY";
     edit.doc.Data().Assign(other);
@@ -227,8 +217,8 @@ TEST(PushOverCurveEdit, TheDocumentIsFollowedWhenItChanges)
     EXPECT_EQ("PY", edit->m_settings.push);
     edit.doc.Data().Assign({});
     EXPECT_EQ(1, edit->OnDocumentChanged());
-    EXPECT_TRUE(edit->Pictured().capacity.Sd.empty());
-    EXPECT_NE("", edit->Refusal());
+    EXPECT_TRUE(edit->Shown().Pictured().capacity.Sd.empty());
+    EXPECT_NE("", edit->Shown().Refusal());
 }
 
 // Between the steps at 0.03 m with 10 kN and 0.06 m with 14 kN, at a quarter of the way.
@@ -245,18 +235,18 @@ TEST(PushoverCells, APointIsPlacedOnTheCurvesOfOtherPlotTypes)
     for (const T_CASE& t : {T_CASE{0, 0.0375, 11.0}, {3, 0.0375, 0.625}}) {
         edit->m_settings.plotType = t.plotType;
         edit->OnEdited();
-        const auto at = PlaceOnCurve(edit->Result(), 0.0375 / kGamma);
+        const auto at = PlaceOnCurve(edit->Shown().Result(), 0.0375 / kGamma);
         ASSERT_TRUE(at) << t.plotType;
         EXPECT_NEAR(t.x, at->x, 1e-12) << t.plotType;
         EXPECT_NEAR(t.y, at->y, 1e-12) << t.plotType;
-        EXPECT_FALSE(PlaceOnCurve(edit->Result(), 0.091 / kGamma)) << "beyond the curve";
+        EXPECT_FALSE(PlaceOnCurve(edit->Shown().Result(), 0.091 / kGamma)) << "beyond the curve";
     }
 }
 
 TEST(CurveDampParamUser, TheCurveOfItsPictureIsLevelOutsideThePoints)
 {
     CPushOverCurveDampParamUser points;
-    points.Data2Dlg({3, 5.0, 10, 0.9, 30, 0.5});
+    points.Data2Dlg({10, 0.9, 30, 0.5});
     const auto curve = points.Curve();
     ASSERT_EQ(4U, curve.size());
     EXPECT_EQ(0.0, curve[0].x);

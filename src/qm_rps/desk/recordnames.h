@@ -1,9 +1,11 @@
-// Names of the records of a table, for lists of choices.
+// Names of the records of a table, and texts of the catalogue, for lists of choices.
 #pragma once
 
+#include "qm_base/msgfunction.h"
 #include "qm_db/records.h"
 
 #include <algorithm>
+#include <span>
 
 /// In the order of the keys.
 template <class T>
@@ -13,6 +15,15 @@ std::vector<std::string> NamesOf(const T_TABLE<T>& table)
     for (const auto& [key, record] : table)
         names.push_back(record.name);
     return names;
+}
+
+/// Texts of catalogue keys.
+inline std::vector<std::string> TextsOf(std::span<const char* const> keys)
+{
+    std::vector<std::string> texts;
+    for (const char* const key : keys)
+        texts.push_back(zql::lib::MMSGFunction::GetValue(key));
+    return texts;
 }
 
 inline bool Contains(const std::vector<std::string>& names, const std::string& name)

@@ -12,11 +12,6 @@ namespace {
 using zql::lib::MMSGFunction;
 using ROW = std::vector<std::string>;
 
-std::string Text(const char* key)
-{
-    return MMSGFunction::GetValue(key);
-}
-
 std::string Number(const std::optional<double>& v)
 {
     return v ? FormatText("%.6g", *v) : "-";
@@ -50,7 +45,8 @@ void AddPointCells(const T_PUSH_EVALUATION& e, T_TEXT_TABLE& t)
         {"D (" + L + "), V (" + F + ")", PerfPointPair(e, &T_PERF_POINT::D, &T_PERF_POINT::V)});
     t.rows.push_back({"Teff (s)", value([](const T_PERF_POINT& p) { return p.Teff; })});
     t.rows.push_back({"Deff (%)", value([](const T_PERF_POINT& p) { return p.damping; })});
-    t.rows.push_back({Text("IDS_QM_UI_PUSH_TRIALS"), std::to_string(e.trace.size())});
+    t.rows.push_back(
+        {MMSGFunction::GetValue("IDS_QM_UI_PUSH_TRIALS"), std::to_string(e.trace.size())});
 }
 
 void AddTargetCells(const T_PUSH_EVALUATION& e, T_TEXT_TABLE& t)
@@ -91,8 +87,10 @@ std::string PerfPointPair(const T_PUSH_EVALUATION& e, double T_PERF_POINT::*firs
 
 T_TEXT_TABLE PushoverResultCells(const T_PUSH_EVALUATION& e)
 {
-    T_TEXT_TABLE t{{{Text("IDS_QM_UI_PUSH_VALUE_OF")}, Column(Text("IDS_QM_UI_PUSH_VALUE"))}, {}};
-    t.rows.push_back({Text("IDS_QM_UI_PUSH_OUTCOME"), OutcomeName(e.outcome)});
+    T_TEXT_TABLE t{{{MMSGFunction::GetValue("IDS_QM_UI_PUSH_VALUE_OF")},
+                    Column(MMSGFunction::GetValue("IDS_QM_UI_PUSH_VALUE"))},
+                   {}};
+    t.rows.push_back({MMSGFunction::GetValue("IDS_QM_UI_PUSH_OUTCOME"), OutcomeName(e.outcome)});
     if (e.IsTarget())
         AddTargetCells(e, t);
     else
@@ -107,12 +105,12 @@ T_TEXT_TABLE PushoverResultCells(const T_PUSH_EVALUATION& e)
 T_TEXT_TABLE PushoverStateCells(const T_PUSH_EVALUATION& e)
 {
     const std::string_view L = Length(e.units);
-    T_TEXT_TABLE t{{{Text("IDS_QM_UI_PUSH_STATE")},
-                    Column(Head(Text("IDS_QM_UI_PUSH_DEMAND"), L)),
-                    Column(Text("IDS_QM_UI_PUSH_STEP")),
-                    Column(Head(Text("IDS_QM_UI_PUSH_CAPACITY"), L)),
-                    Column(Text("IDS_QM_UI_PUSH_STEP")),
-                    {Text("IDS_QM_UI_PUSH_REMARK")}},
+    T_TEXT_TABLE t{{{MMSGFunction::GetValue("IDS_QM_UI_PUSH_STATE")},
+                    Column(Head(MMSGFunction::GetValue("IDS_QM_UI_PUSH_DEMAND"), L)),
+                    Column(MMSGFunction::GetValue("IDS_QM_UI_PUSH_STEP")),
+                    Column(Head(MMSGFunction::GetValue("IDS_QM_UI_PUSH_CAPACITY"), L)),
+                    Column(MMSGFunction::GetValue("IDS_QM_UI_PUSH_STEP")),
+                    {MMSGFunction::GetValue("IDS_QM_UI_PUSH_REMARK")}},
                    {}};
     for (const T_LIMIT_ROW& r : e.limitStates)
         t.rows.push_back({r.name, Number(r.demand), Step(r.demandStep), Number(r.capacity),
@@ -137,7 +135,7 @@ T_TEXT_TABLE PushoverTrialCells(const T_PUSH_EVALUATION& e)
     T_TEXT_TABLE t{{Column(Head("dpi", L)), Column("api (g)")}, {}};
     for (const T_CELL& c : cells)
         t.columns.push_back(Column(c.unit.empty() ? c.head : Head(c.head, c.unit)));
-    t.columns.push_back({Text("IDS_QM_UI_PUSH_COEFFICIENTS")});
+    t.columns.push_back({MMSGFunction::GetValue("IDS_QM_UI_PUSH_COEFFICIENTS")});
     for (const T& trial : e.trace) {
         ROW row{Number(trial.dpi), Number(trial.api)};
         for (const T_CELL& c : cells)
@@ -160,7 +158,7 @@ T_TEXT_TABLE PushoverCurveCells(const T_PUSH_EVALUATION& e)
 T_TEXT_TABLE AdditionalStepCells(const T_PUSH_EVALUATION& e)
 {
     const std::string_view L = Length(e.units);
-    T_TEXT_TABLE t{{Column(Text("IDS_QM_UI_PUSH_STEP")), Column(Head("D", L)),
+    T_TEXT_TABLE t{{Column(MMSGFunction::GetValue("IDS_QM_UI_PUSH_STEP")), Column(Head("D", L)),
                     Column(Head("V", Force(e.units))), Column(Head("Sd", L)), Column("Sa (g)")},
                    {}};
     for (const T_ADDITIONAL_STEP& s : e.additionalSteps)
@@ -172,12 +170,12 @@ T_TEXT_TABLE AdditionalStepCells(const T_PUSH_EVALUATION& e)
 T_TEXT_TABLE AdditionalPointCells(const T_PUSH_EVALUATION& e)
 {
     const std::string_view L = Length(e.units);
-    T_TEXT_TABLE t{{{Text("IDS_QM_UI_HEAD_SPECTRUM")},
+    T_TEXT_TABLE t{{{MMSGFunction::GetValue("IDS_QM_UI_HEAD_SPECTRUM")},
                     Column(Head("D", L)),
                     Column(Head("V", Force(e.units))),
                     Column(Head("Sd", L)),
                     Column("Sa (g)"),
-                    {Text("IDS_QM_UI_PUSH_OUTCOME")}},
+                    {MMSGFunction::GetValue("IDS_QM_UI_PUSH_OUTCOME")}},
                    {}};
     for (const T_ADDITIONAL_POINT& p : e.additionalPoints) {
         const auto value = [&](double T_PERF_POINT::*member) {

@@ -1,7 +1,5 @@
 #include "qm_rps/pushover/pushovercomparison.h"
 
-#include "qm_rps/pushovercurvedlg.h"
-
 #include <algorithm>
 
 namespace {
@@ -27,7 +25,7 @@ constexpr std::array<T_METHOD_ROW, 8> kMethods{{
 // clang-format on
 
 T_COMPARISON_ROW RowOf(const T_METHOD_ROW& method, const T_PUSH_EVALUATION& e,
-                       const CPushOverCurveDlg& driver)
+                       const CPushEvaluator& evaluator)
 {
     T_COMPARISON_ROW row;
     row.label = method.label;
@@ -45,7 +43,7 @@ T_COMPARISON_ROW RowOf(const T_METHOD_ROW& method, const T_PUSH_EVALUATION& e,
         row.D = *state.demand;
         row.Sd = e.factors.gamma != 0.0 ? row.D / e.factors.gamma : 0.0;
         row.Sa = row.V = CurveAccelAt(e.capacity.View(), row.Sd);
-        driver.TransferToDispAndReac(nullptr, &row.V);
+        evaluator.TransferToDispAndReac(nullptr, &row.V);
     }
     return row;
 }
@@ -65,12 +63,11 @@ void CalcSpread(T_PUSH_COMPARISON& c)
 
 } // namespace
 
-int ComparePushover(CDBDoc& doc, const std::string& push, const std::string& spectrum, int behavior,
-                    T_PUSH_COMPARISON& out, std::string& error)
+int ComparePushover(CPushEvaluator& evaluator, const std::string& push, const std::string& spectrum,
+                    int behavior, T_PUSH_COMPARISON& out, T_FINDING& refusal)
 {
     T_PUSH_COMPARISON c;
-    CPushOverCurveDlg driver(doc);
-    driver.SetStoreSteps(false);
+    evaluator.SetStoreSteps(false);
     for (const T_METHOD_ROW& method : kMethods) {
         T_EVAL_D eval;
         eval.name = method.label;
@@ -79,13 +76,10 @@ int ComparePushover(CDBDoc& doc, const std::string& push, const std::string& spe
         eval.method = method.method;
         eval.procedure = method.procedure;
         eval.behavior = behavior;
-        if (!driver.SetEvaluation(eval)) {
-            error = driver.SettingsError();
-            return 0;
-        }
-        driver.Evaluate();
-        c.rows.push_back(RowOf(method, driver.Result(), driver));
-        c.results.push_back(driver.Result());
+        if (!evaluator.SetEvaluation(eval, refusal)) return 0;
+        evaluator.Evaluate();
+        c.rows.push_back(RowOf(method, evaluator.Result(), evaluator));
+        c.results.push_back(evaluator.Result());
     }
     CalcSpread(c);
     out = std::move(c);

@@ -1,7 +1,7 @@
 // Every applicable method on one capacity curve with one spectrum, side by side.
 #pragma once
 
-#include "qm_rps/pushover/pushevaluation.h"
+#include "qm_rps/pushover/pushevaluator.h"
 
 struct T_COMPARISON_ROW {
     std::string label; // "ATC-40 A", "EC8 SD", "NTC2018 SLV"
@@ -19,7 +19,9 @@ struct T_PUSH_COMPARISON {
 };
 
 /// ATC-40 A and B, FEMA 440 A, B and C, Eurocode 8 (SD) and NTC 2008 and 2018 (SLV), with their
-/// defaults and the given behaviour type (0 to 2). The model is not changed. 1 done; 0 there is
-/// no such load case or spectrum (error says which), output as it was.
-[[nodiscard]] int ComparePushover(CDBDoc& doc, const std::string& push, const std::string& spectrum,
-                                  int behavior, T_PUSH_COMPARISON& out, std::string& error);
+/// defaults and the given behaviour type (0 to 2). The evaluator no longer stores steps: the model
+/// is not changed. 1 done; 0 there is no such load case or spectrum (refusal says which), output as
+/// it was.
+[[nodiscard]] int ComparePushover(CPushEvaluator& evaluator, const std::string& push,
+                                  const std::string& spectrum, int behavior, T_PUSH_COMPARISON& out,
+                                  T_FINDING& refusal);

@@ -11,11 +11,6 @@ namespace {
 
 using zql::lib::MMSGFunction;
 
-std::string Text(const char* key)
-{
-    return MMSGFunction::GetValue(key);
-}
-
 /// Performance points as circles, target displacements as squares. Points that lie closer than
 /// 2 % of the picture share one label.
 void AddRows(T_PLOT& plot, const T_PUSH_COMPARISON& c, double width)
@@ -59,16 +54,16 @@ T_PLOT ComparisonPlot(const T_PUSH_COMPARISON& c)
     const std::string unit(NameOf(first.units.length));
     plot.title = MMSGFunction::Format("IDS_QM_UI_PLOT_ALL_METHODS", {first.eval.push});
     plot.subtitle = MMSGFunction::Format("IDS_QM_UI_PLOT_ALL_SUBTITLE", {first.eval.spectrum});
-    plot.x.title = Text("IDS_QM_UI_PLOT_SD") + " (" + unit + ")";
-    plot.y.title = Text("IDS_QM_UI_PLOT_SA") + " (g)";
-    AddAdrsCurve(plot, Text("IDS_QM_UI_PLOT_DEMAND").c_str(), first.demand, PLOT_LINE::Solid, 1.6,
-                 {20, 64, 140});
-    AddAdrsCurve(plot, Text("IDS_QM_UI_PLOT_CAPACITY").c_str(), first.capacity, PLOT_LINE::Solid,
-                 2.6, {0, 0, 0});
+    plot.x.title = MMSGFunction::GetValue("IDS_QM_UI_PLOT_SD") + " (" + unit + ")";
+    plot.y.title = MMSGFunction::GetValue("IDS_QM_UI_PLOT_SA") + " (g)";
+    AddAdrsCurve(plot, MMSGFunction::GetValue("IDS_QM_UI_PLOT_DEMAND").c_str(), first.demand,
+                 PLOT_LINE::Solid, 1.6, {20, 64, 140});
+    AddAdrsCurve(plot, MMSGFunction::GetValue("IDS_QM_UI_PLOT_CAPACITY").c_str(), first.capacity,
+                 PLOT_LINE::Solid, 2.6, {0, 0, 0});
     for (const T_PUSH_EVALUATION& e : c.results) {
         if (e.eval.method != PUSH_METHOD::Ec8Opcm || !e.bilinear) continue;
         const T_BILINEAR& b = *e.bilinear;
-        AddAdrsCurve(plot, (Text("IDS_QM_UI_PLOT_BILINEAR") + " (EC8)").c_str(),
+        AddAdrsCurve(plot, (MMSGFunction::GetValue("IDS_QM_UI_PLOT_BILINEAR") + " (EC8)").c_str(),
                      {{0.0, b.dy, b.du}, {0.0, b.ay, b.au}}, PLOT_LINE::DashDot, 1.6,
                      {20, 110, 60});
     }

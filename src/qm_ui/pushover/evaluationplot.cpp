@@ -16,11 +16,6 @@ constexpr T_PLOT_COLOR kBlack{0, 0, 0}, kBlue{20, 64, 140}, kRed{184, 40, 30}, k
 
 using zql::lib::MMSGFunction;
 
-std::string Text(const char* key)
-{
-    return MMSGFunction::GetValue(key);
-}
-
 /// "D demand = 12.3 m".
 std::string ValueText(const std::string& what, double value, const char* format,
                       const std::string& unit)
@@ -41,14 +36,15 @@ std::string ForceUnit(const T_PUSH_EVALUATION& e)
 void AddDemands(T_PLOT& plot, const T_PUSH_EVALUATION& e)
 {
     if (e.stateDemands.empty()) {
-        AddAdrsCurve(plot, Text("IDS_QM_UI_PLOT_DEMAND").c_str(), e.demand, PLOT_LINE::Solid, 1.6,
-                     kBlue);
+        AddAdrsCurve(plot, MMSGFunction::GetValue("IDS_QM_UI_PLOT_DEMAND").c_str(), e.demand,
+                     PLOT_LINE::Solid, 1.6, kBlue);
         return;
     }
     constexpr std::array<PLOT_LINE, 4> kLines{PLOT_LINE::Dot, PLOT_LINE::DashDot, PLOT_LINE::Dash,
                                               PLOT_LINE::Solid};
     for (std::size_t i = 0; i < e.stateDemands.size(); ++i) {
-        const std::string name = Text("IDS_QM_UI_PLOT_DEMAND") + " " + kLimitStateNames[i];
+        const std::string name =
+            MMSGFunction::GetValue("IDS_QM_UI_PLOT_DEMAND") + " " + kLimitStateNames[i];
         AddAdrsCurve(plot, name.c_str(), e.stateDemands[i], kLines[i], 1.6, kBlue);
     }
 }
@@ -79,8 +75,8 @@ void AddTrials(T_PLOT& plot, const T_PUSH_EVALUATION& e)
         points.Sd.push_back(t.dpi);
         points.Sa.push_back(t.api);
     }
-    AddAdrsCurve(plot, Text("IDS_QM_UI_PLOT_TRIALS").c_str(), points, PLOT_LINE::None, 1.0, kOchre,
-                 PLOT_MARKER::Square);
+    AddAdrsCurve(plot, MMSGFunction::GetValue("IDS_QM_UI_PLOT_TRIALS").c_str(), points,
+                 PLOT_LINE::None, 1.0, kOchre, PLOT_MARKER::Square);
     constexpr std::size_t kNumbered = 6;
     if (e.trace.size() > kNumbered) return;
     for (const T_PERFPT_TRIAL& t : e.trace)
@@ -91,8 +87,8 @@ void AddPoint(T_PLOT& plot, const T_PUSH_EVALUATION& e)
 {
     if (!e.point) return;
     const T_PERF_POINT& p = *e.point;
-    const std::string title =
-        Text(e.result == 2 ? "IDS_QM_UI_PLOT_ELASTIC_POINT" : "IDS_QM_UI_PLOT_POINT");
+    const std::string title = MMSGFunction::GetValue(e.result == 2 ? "IDS_QM_UI_PLOT_ELASTIC_POINT"
+                                                                   : "IDS_QM_UI_PLOT_POINT");
     plot.labels.push_back({p.Sd, p.Sa,
                            FormatText("%s\nSd = %.4g %s, Sa = %.4g g", title.c_str(), p.Sd,
                                       LengthUnit(e).c_str(), p.Sa),
@@ -107,8 +103,8 @@ void AddExtras(T_PLOT& plot, const T_PUSH_EVALUATION& e)
     };
     for (const T_PERF_POINT& p : e.allPoints) {
         if (!isAnswer(p))
-            plot.labels.push_back(
-                {p.Sd, p.Sa, Text("IDS_QM_UI_PLOT_BALANCED"), PLOT_MARKER::Triangle, false});
+            plot.labels.push_back({p.Sd, p.Sa, MMSGFunction::GetValue("IDS_QM_UI_PLOT_BALANCED"),
+                                   PLOT_MARKER::Triangle, false});
     }
     for (const T_ADDITIONAL_STEP& s : e.additionalSteps)
         plot.labels.push_back({s.Sd, s.Sa, PlotStepText(s.step), PLOT_MARKER::Plus, false});
@@ -123,7 +119,7 @@ void AddTargets(T_PLOT& plot, const T_PUSH_EVALUATION& e)
 {
     if (e.bilinear) {
         const T_BILINEAR& b = *e.bilinear;
-        AddAdrsCurve(plot, Text("IDS_QM_UI_PLOT_BILINEAR").c_str(),
+        AddAdrsCurve(plot, MMSGFunction::GetValue("IDS_QM_UI_PLOT_BILINEAR").c_str(),
                      {{0.0, b.dy, b.du}, {0.0, b.ay, b.au}}, PLOT_LINE::DashDot, 1.6, kGreen);
     }
     for (const T_GUIDE_LINE& line : e.guideLines) {
@@ -181,15 +177,17 @@ std::string PlotSubtitle(const T_PUSH_EVALUATION& e)
 
 void AddEvaluationNotes(T_PLOT& plot, const T_PUSH_EVALUATION& e)
 {
-    plot.notes.push_back(Text("IDS_QM_UI_PLOT_OUTCOME") + ": " + OutcomeName(e.outcome));
+    plot.notes.push_back(MMSGFunction::GetValue("IDS_QM_UI_PLOT_OUTCOME") + ": " +
+                         OutcomeName(e.outcome));
     if (e.point) {
         plot.notes.push_back(FormatText("D = %.5g %s", e.point->D, LengthUnit(e).c_str()));
         plot.notes.push_back(FormatText("V = %.5g %s", e.point->V, ForceUnit(e).c_str()));
         plot.notes.push_back(FormatText("T_eff = %.4g s", e.point->Teff));
         if (e.point->damping)
-            plot.notes.push_back(
-                ValueText(Text("IDS_QM_UI_PLOT_DAMPING"), *e.point->damping, "%.4g", "%"));
-        plot.notes.push_back(Text("IDS_QM_UI_PUSH_TRIALS") + ": " + std::to_string(e.trace.size()));
+            plot.notes.push_back(ValueText(MMSGFunction::GetValue("IDS_QM_UI_PLOT_DAMPING"),
+                                           *e.point->damping, "%.4g", "%"));
+        plot.notes.push_back(MMSGFunction::GetValue("IDS_QM_UI_PUSH_TRIALS") + ": " +
+                             std::to_string(e.trace.size()));
     }
     for (const T_LIMIT_ROW& row : e.limitStates) {
         if (row.demand)
@@ -206,17 +204,17 @@ T_PLOT EvaluationPlot(const T_PUSH_EVALUATION& e)
     T_PLOT plot;
     plot.title = e.eval.name;
     plot.subtitle = PlotSubtitle(e);
-    plot.x.title = Text("IDS_QM_UI_PLOT_SD") + " (" + LengthUnit(e) + ")";
-    plot.y.title = Text("IDS_QM_UI_PLOT_SA") + " (g)";
+    plot.x.title = MMSGFunction::GetValue("IDS_QM_UI_PLOT_SD") + " (" + LengthUnit(e) + ")";
+    plot.y.title = MMSGFunction::GetValue("IDS_QM_UI_PLOT_SA") + " (g)";
     AddDemands(plot, e);
-    AddAdrsCurve(plot, Text("IDS_QM_UI_PLOT_WORKING").c_str(), e.working, PLOT_LINE::DashDot, 1.4,
-                 kGray);
-    AddAdrsCurve(plot, Text("IDS_QM_UI_PLOT_REDUCED").c_str(), e.reduced, PLOT_LINE::Dash, 1.8,
-                 kRed);
-    AddAdrsCurve(plot, Text("IDS_QM_UI_PLOT_CAPACITY").c_str(), e.capacity, PLOT_LINE::Solid, 2.6,
-                 kBlack);
-    AddAdrsCurve(plot, Text("IDS_QM_UI_PLOT_LOCUS").c_str(), e.locus, PLOT_LINE::Dot, 1.6, kGreen,
-                 PLOT_MARKER::Triangle);
+    AddAdrsCurve(plot, MMSGFunction::GetValue("IDS_QM_UI_PLOT_WORKING").c_str(), e.working,
+                 PLOT_LINE::DashDot, 1.4, kGray);
+    AddAdrsCurve(plot, MMSGFunction::GetValue("IDS_QM_UI_PLOT_REDUCED").c_str(), e.reduced,
+                 PLOT_LINE::Dash, 1.8, kRed);
+    AddAdrsCurve(plot, MMSGFunction::GetValue("IDS_QM_UI_PLOT_CAPACITY").c_str(), e.capacity,
+                 PLOT_LINE::Solid, 2.6, kBlack);
+    AddAdrsCurve(plot, MMSGFunction::GetValue("IDS_QM_UI_PLOT_LOCUS").c_str(), e.locus,
+                 PLOT_LINE::Dot, 1.6, kGreen, PLOT_MARKER::Triangle);
     AddTargets(plot, e);
     AddTrials(plot, e);
     AddPoint(plot, e);

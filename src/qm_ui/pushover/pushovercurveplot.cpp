@@ -13,16 +13,11 @@ using KIND = T_GUIDE_LINE::KIND;
 constexpr T_PLOT_COLOR kBlack{0, 0, 0}, kRed{184, 40, 30}, kGreen{20, 110, 60},
     kOchre{190, 120, 20}, kViolet{110, 40, 140};
 
-std::string Text(const char* key)
-{
-    return MMSGFunction::GetValue(key);
-}
-
 /// On the curve of the other plot type: the point, the trials, the limit states, the steps.
 void AddPlaces(T_PLOT& plot, const T_PUSH_EVALUATION& e)
 {
     T_PLOT_SERIES trials;
-    trials.name = Text("IDS_QM_UI_PLOT_TRIALS");
+    trials.name = MMSGFunction::GetValue("IDS_QM_UI_PLOT_TRIALS");
     trials.line = PLOT_LINE::None;
     trials.marker = PLOT_MARKER::Square;
     trials.color = kOchre;
@@ -34,10 +29,10 @@ void AddPlaces(T_PLOT& plot, const T_PUSH_EVALUATION& e)
     }
     if (!trials.x.empty()) plot.series.push_back(std::move(trials));
     if (const auto at = e.point ? PlaceOnCurve(e, e.point->Sd) : std::nullopt)
-        plot.labels.push_back(
-            {at->x, at->y,
-             Text("IDS_QM_UI_PLOT_POINT") + "\n" + FormatText("x = %.4g, y = %.4g", at->x, at->y),
-             PLOT_MARKER::Circle, true});
+        plot.labels.push_back({at->x, at->y,
+                               MMSGFunction::GetValue("IDS_QM_UI_PLOT_POINT") + "\n" +
+                                   FormatText("x = %.4g, y = %.4g", at->x, at->y),
+                               PLOT_MARKER::Circle, true});
     for (const T_GUIDE_LINE& line : e.guideLines)
         if (const auto at = PlaceOnCurve(e, line.Sd))
             plot.guides.push_back({PLOT_GUIDE::Vertical, at->x, line.label,
@@ -59,7 +54,7 @@ T_PLOT OtherPlot(const T_PUSH_EVALUATION& e)
     plot.x.title = PlotXTitle(e.curve.type, e.units);
     plot.y.title = PlotYTitle(e.curve.type, e.units);
     T_PLOT_SERIES curve;
-    curve.name = Text("IDS_QM_UI_PLOT_CURVE");
+    curve.name = MMSGFunction::GetValue("IDS_QM_UI_PLOT_CURVE");
     curve.x = e.curve.x;
     curve.y = e.curve.y;
     curve.line = PLOT_LINE::Solid;
@@ -137,8 +132,8 @@ T_PLOT PushoverCurvePlot(const T_PUSH_EVALUATION& e, const T_PUSH_SHOW& show, in
 T_PLOT UserDampingPlot(const CPushOverCurveDampParamUser& points)
 {
     T_PLOT plot;
-    plot.x.title = Text("IDS_QM_UI_PLOT_BETA") + " (%)";
-    plot.y.title = Text("IDS_QM_UI_PLOT_KAPPA");
+    plot.x.title = MMSGFunction::GetValue("IDS_QM_UI_PLOT_BETA") + " (%)";
+    plot.y.title = MMSGFunction::GetValue("IDS_QM_UI_PLOT_KAPPA");
     T_PLOT_SERIES s;
     s.name = "kappa";
     for (const T_POINT2& p : points.Curve()) {

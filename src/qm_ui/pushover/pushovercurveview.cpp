@@ -1,7 +1,6 @@
 #include "qm_ui/pushover/pushovercurveview.h"
 
 #include "qm_base/msgfunction.h"
-#include "qm_rps/pushovercurvesub4dlg.h"
 #include "qm_ui/plot/plotdrawing.h"
 #include "qm_ui/plot/plotfile.h"
 #include "qm_ui/pushover/pushovercurveplot.h"
@@ -15,7 +14,7 @@ using MODEL = CPushOverCurveEdit;
 
 T_PLOT PlotOf(const MODEL& m)
 {
-    return PushoverCurvePlot(m.Pictured(), m.m_show, m.Trial());
+    return PushoverCurvePlot(m.Shown().Pictured(), m.m_show, m.Shown().Trial());
 }
 
 void OnGraphExport(MODEL& m)
@@ -56,53 +55,49 @@ void BuildEvaluation(CFormView& form, MODEL& m)
 void BuildMethod(CFormView& form, MODEL& m)
 {
     T_EVAL_D& s = m.m_settings;
-    const auto pushes = [&m] { return m.LoadCases(); };
-    const auto spectra = [&m] { return m.Spectra(); };
+    const auto pushes = [&m] { return m.m_methodPage.LoadCases(); };
+    const auto spectra = [&m] { return m.m_demandPage.Spectra(); };
     form.Choice(KeyText("IDS_QM_UI_HEAD_PUSHOVER"), NameRef(s.push, pushes), pushes).name = "push";
     form.Choice(
             KeyText("IDS_QM_UI_HEAD_METHOD"),
             {[&s] { return static_cast<int>(s.method) - static_cast<int>(PUSH_METHOD::Fema440); },
              [&m](const int& i) {
-                 m.ChangeMethod(
+                 m.m_methodPage.ChangeMethod(
                      static_cast<PUSH_METHOD>(i + static_cast<int>(PUSH_METHOD::Fema440)));
              }},
-            MODEL::Methods)
+            CPushOverCurveSub1Dlg::Methods)
         .name = "method";
     auto& procedure =
         form.Choice(KeyText("IDS_QM_UI_PUSH_PROCEDURE"),
                     {[&s] { return s.procedure.value_or('A') - 'A'; },
                      [&s](const int& i) { s.procedure = static_cast<char>('A' + i); }},
-                    [&m] { return m.Procedures(); });
+                    [&m] { return m.m_methodPage.Procedures(); });
     procedure.name = "procedure";
-    procedure.shown = [&m] { return !m.IsTarget(); };
+    procedure.shown = [&m] { return !m.m_methodPage.IsTarget(); };
     form.Choice(KeyText("IDS_QM_UI_HEAD_SPECTRUM"), NameRef(s.spectrum, spectra), spectra).name =
         "spectrum";
     form.Choice(KeyText("IDS_QM_UI_PUSH_PLOT"),
                 {[&s] { return s.plotType.value_or(static_cast<int>(s.method)); },
                  [&s](const int& i) { s.plotType = i; }},
-                MODEL::PlotTypes)
+                CPushOverCurveSub1Dlg::PlotTypes)
         .name = "plotType";
 }
 
 void BuildDamping(CFormView& form, MODEL& m)
 {
     T_EVAL_D& s = m.m_settings;
-    auto& behavior = form.Choice(
-        [&m] {
-            const bool fema = m.m_settings.method == PUSH_METHOD::Fema440;
-            return MMSGFunction::GetValue(fema ? "IDS_QM_UI_PUSH_HYSTERESIS"
-                                               : "IDS_QM_UI_PUSH_BEHAVIOR");
-        },
-        OrDefault(s.behavior, 0), [&m] { return m.Behaviors(); });
+    auto& behavior =
+        form.Choice([&m] { return m.m_demandPage.BehaviorLabel(); }, OrDefault(s.behavior, 0),
+                    [&m] { return m.m_demandPage.Behaviors(); });
     behavior.name = "behavior";
-    behavior.shown = [&m] { return !m.IsTarget(); };
+    behavior.shown = [&m] { return !m.m_methodPage.IsTarget(); };
     auto& damping = form.Number(KeyText("IDS_QM_UI_PUSH_ELASTIC_DAMPING"),
                                 OrDefault(s.elasticDamping, 5.0), PlainLabel("%"));
     damping.name = "elasticDamping";
-    damping.shown = [&m] { return !m.IsTarget(); };
+    damping.shown = [&m] { return !m.m_methodPage.IsTarget(); };
     auto& user = form.Button(KeyText("IDS_QM_UI_PUSH_USER_DAMPING"), [&m] { m.OnUserDamping(); });
     user.name = "userDamping";
-    user.shown = [&m] { return m.HasUserDamping(); };
+    user.shown = [&m] { return m.m_demandPage.HasUserDamping(); };
     form.Flag(KeyText("IDS_QM_UI_PUSH_EIGEN"), OrDefault(s.eigenFactors, true)).name = "eigen";
     auto& percent =
         form.Flag(KeyText("IDS_QM_UI_PUSH_ALPHA_PCT"), OrDefault(s.alphaInPercent, false));
@@ -113,30 +108,31 @@ void BuildDamping(CFormView& form, MODEL& m)
         {[&s] { return s.driftKind.value_or(1) - 1; }, [&s](const int& i) { s.driftKind = i + 1; }},
         KeyTexts({"IDS_QM_UI_PUSH_DRIFT_1", "IDS_QM_UI_PUSH_DRIFT_2"}));
     drift.name = "driftKind";
-    drift.shown = [&m] { return m.IsTarget(); };
+    drift.shown = [&m] { return m.m_methodPage.IsTarget(); };
     auto& masonry = form.Flag(KeyText("IDS_QM_UI_PUSH_MASONRY"), OrDefault(s.masonry, false));
     masonry.name = "masonry";
     masonry.shown = [&m] { return m.m_settings.method == PUSH_METHOD::Ec8Opcm; };
 }
 
-void BuildBilinear(CFormView& form, MODEL& m)
+void BuildBilinear(CFormView& form, MODEL& model)
 {
+    CPushOverCurveSub4Dlg& m = model.m_bilinearPage;
     const auto value = [&m](auto member) {
-        using T = std::remove_reference_t<decltype(m.Bilinear().*member)>;
-        return T_BINDING<T>{[&m, member] { return m.Bilinear().*member; },
-                            [&m, member](const T& v) { m.Bilinear().*member = v; }};
+        using T = std::remove_reference_t<decltype(m.Options().*member)>;
+        return T_BINDING<T>{[&m, member] { return m.Options().*member; },
+                            [&m, member](const T& v) { m.Options().*member = v; }};
     };
     static const std::vector<std::string> rules{"", "ec8", "ntc", "masonry"};
     form.Choice(KeyText(CPushOverCurveSub4Dlg::kLabels[0]),
                 {[&m] {
-                     const auto it = std::ranges::find(rules, m.Bilinear().rule.value_or(""));
+                     const auto it = std::ranges::find(rules, m.Options().rule.value_or(""));
                      return static_cast<int>(it - rules.begin());
                  },
                  [&m](const int& i) {
                      if (i == 0)
-                         m.Bilinear().rule.reset();
+                         m.Options().rule.reset();
                      else
-                         m.Bilinear().rule = rules[static_cast<std::size_t>(i)];
+                         m.Options().rule = rules[static_cast<std::size_t>(i)];
                  }},
                 KeyTexts({"IDS_QM_UI_PUSH_RULE_OWN", "IDS_QM_UI_PUSH_RULE_EC8",
                           "IDS_QM_UI_PUSH_RULE_NTC", "IDS_QM_UI_PUSH_RULE_MASONRY"}))
@@ -148,10 +144,10 @@ void BuildBilinear(CFormView& form, MODEL& m)
     form.Optional(KeyText("IDS_QM_UI_PUSH_FRACTION"), value(&T_EVAL_BILINEAR::drop)).name =
         "bilinear.drop";
     auto& iterate = form.Flag(KeyText("IDS_QM_UI_PUSH_ITERATE"),
-                              {[&m] { return m.Bilinear().iterate.value_or(false); },
-                               [&m](const bool& on) { m.Bilinear().iterate = on; }});
+                              {[&m] { return m.Options().iterate.value_or(false); },
+                               [&m](const bool& on) { m.Options().iterate = on; }});
     iterate.name = "bilinear.iterate";
-    iterate.enabled = [&m] { return m.m_settings.method == PUSH_METHOD::Ec8Opcm; };
+    iterate.enabled = [&model] { return model.m_settings.method == PUSH_METHOD::Ec8Opcm; };
 }
 
 void BuildShown(CFormView& form, MODEL& m)
@@ -167,30 +163,30 @@ void BuildShown(CFormView& form, MODEL& m)
 
 void BuildResults(CFormView& form, MODEL& m)
 {
-    const auto target = [&m] { return m.IsTarget(); };
-    const auto point = [&m] { return !m.IsTarget(); };
+    const auto target = [&m] { return m.m_methodPage.IsTarget(); };
+    const auto point = [&m] { return !m.m_methodPage.IsTarget(); };
     form.Page(KeyText("IDS_QM_UI_PUSH_PAGE_RESULT"));
-    form.Grid(GridOf([&m] { return PushoverResultCells(m.Result()); })).name = "cells";
+    form.Grid(GridOf([&m] { return PushoverResultCells(m.Shown().Result()); })).name = "cells";
     form.Page(KeyText("IDS_QM_UI_PUSH_PAGE_STATES"), target);
-    form.Grid(GridOf([&m] { return PushoverStateCells(m.Result()); })).name = "states";
+    form.Grid(GridOf([&m] { return PushoverStateCells(m.Shown().Result()); })).name = "states";
     form.Note([&m] { return m.StoredStepsText(); });
     form.Button(KeyText("IDS_QM_UI_PUSH_STORE_STEPS"), [&m] { (void)m.OnStoreSteps(); }).name =
         "storeSteps";
     form.Page(KeyText("IDS_QM_UI_PUSH_TRIALS"), point);
-    T_GRID_BINDING trials = GridOf([&m] { return PushoverTrialCells(m.Pictured()); });
-    trials.selected = [&m] { return m.Trial() - 1; };
-    trials.select = [&m](int row) { m.SetTrial(row + 1); };
+    T_GRID_BINDING trials = GridOf([&m] { return PushoverTrialCells(m.Shown().Pictured()); });
+    trials.selected = [&m] { return m.Shown().Trial() - 1; };
+    trials.select = [&m](int row) { m.Shown().SetTrial(row + 1); };
     form.Grid(std::move(trials)).name = "trials";
     form.Page(KeyText("IDS_QM_UI_PUSH_PAGE_OUTCOME"));
     form.Custom({}, MakeTextPage(
                         [&m] {
-                            return OutcomeLines(m.Result()) + "\n" + m.CaseText() + "\n" +
-                                   m.Result().gammaNote;
+                            return OutcomeLines(m.Shown().Result()) + "\n" + m.Shown().CaseText() +
+                                   "\n" + m.Shown().Result().gammaNote;
                         },
                         form.Host()))
         .name = "outcome";
     form.Page(KeyText("IDS_QM_UI_PUSH_PAGE_CURVE"));
-    form.Grid(GridOf([&m] { return PushoverCurveCells(m.Pictured()); })).name = "curve";
+    form.Grid(GridOf([&m] { return PushoverCurveCells(m.Shown().Pictured()); })).name = "curve";
 }
 
 void BuildAdditional(CFormView& form, MODEL& m)
@@ -209,14 +205,14 @@ void BuildAdditional(CFormView& form, MODEL& m)
         form.EndColumns();
     };
     form.Page(KeyText("IDS_QM_UI_PUSH_PAGE_STEPS"));
-    list(GridOf([&m] { return AdditionalStepCells(m.Result()); }), m.m_stepRow, "steps");
+    list(GridOf([&m] { return AdditionalStepCells(m.Shown().Result()); }), m.m_stepRow, "steps");
     form.Integer(KeyText("IDS_QM_UI_PUSH_STEP"), Ref(m.m_addStep)).name = "addStepNumber";
     buttons(
         "IDS_QM_UI_PUSH_ADD_STEP", [&m] { m.OnAddStep(); }, [&m] { m.OnRemoveStep(m.m_stepRow); },
         "Step");
-    form.Page(KeyText("IDS_QM_UI_PUSH_PAGE_POINTS"), [&m] { return !m.IsTarget(); });
-    list(GridOf([&m] { return AdditionalPointCells(m.Result()); }), m.m_pointRow, "points");
-    const auto spectra = [&m] { return m.Spectra(); };
+    form.Page(KeyText("IDS_QM_UI_PUSH_PAGE_POINTS"), [&m] { return !m.m_methodPage.IsTarget(); });
+    list(GridOf([&m] { return AdditionalPointCells(m.Shown().Result()); }), m.m_pointRow, "points");
+    const auto spectra = [&m] { return m.m_demandPage.Spectra(); };
     form.Choice(KeyText("IDS_QM_UI_HEAD_SPECTRUM"), NameRef(m.m_addSpectrum, spectra), spectra)
         .name = "addPointSpectrum";
     buttons(
@@ -258,7 +254,7 @@ void BuildPushOverCurve(CFormView& form, CPushOverCurveEdit& m)
     BuildMethod(form, m);
     BuildDamping(form, m);
     form.Space();
-    form.Page(KeyText("IDS_QM_UI_PUSH_PAGE_BILINEAR"), [&m] { return m.IsTarget(); });
+    form.Page(KeyText("IDS_QM_UI_PUSH_PAGE_BILINEAR"), [&m] { return m.m_methodPage.IsTarget(); });
     BuildBilinear(form, m);
     form.Space();
     form.Page(KeyText("IDS_QM_UI_PUSH_PAGE_SHOWN"));
@@ -266,22 +262,22 @@ void BuildPushOverCurve(CFormView& form, CPushOverCurveEdit& m)
     form.Space();
     form.EndPages();
     form.NextColumn(1);
-    auto& refusal = form.Note([&m] { return m.Refusal(); });
+    auto& refusal = form.Note([&m] { return m.Shown().Refusal(); });
     refusal.name = "refusal";
-    refusal.shown = [&m] { return !m.Refusal().empty(); };
+    refusal.shown = [&m] { return !m.Shown().Refusal().empty(); };
     const auto plot = [&m] {
         T_PLOT shown = PlotOf(m);
         shown.notes.clear(); // their values stand in the cells
         return shown;
     };
     AddPicture(form, plot, {680, 400}).name = "plot";
-    auto& trial =
-        form.Custom(KeyText("IDS_QM_UI_PUSH_TRIAL"),
-                    MakeStepField(
-                        {[&m] { return m.Trial(); }, [&m](const int& k) { m.SetTrial(k); }},
-                        [&m] { return m.TrialCount(); }, form.Changed(), form.Host()));
+    auto& trial = form.Custom(
+        KeyText("IDS_QM_UI_PUSH_TRIAL"),
+        MakeStepField(
+            {[&m] { return m.Shown().Trial(); }, [&m](const int& k) { m.Shown().SetTrial(k); }},
+            [&m] { return m.Shown().TrialCount(); }, form.Changed(), form.Host()));
     trial.name = "trial";
-    trial.shown = [&m] { return !m.IsTarget(); };
+    trial.shown = [&m] { return !m.m_methodPage.IsTarget(); };
     BuildResults(form, m);
     BuildAdditional(form, m);
     form.EndPages();

@@ -1,0 +1,365 @@
+#include "qm_rps/pushover/pushevaluator.h"
+
+#include "qm_base/msgfunction.h"
+#include "qm_base/textformat.h"
+#include "qm_db/filectrl.h"
+#include "qm_db/recordrules.h"
+#include "qm_rps/pushover/adrsformulas.h"
+#include "qm_rps/pushover/pushoverallpoints.h"
+#include "qm_rps/pushover/refusal.h"
+
+#include <algorithm>
+#include <cmath>
+
+using zql::lib::MMSGFunction;
+
+namespace {
+
+/// How Gamma is defined: by the mode as recorded, from the nodal masses, or for NTC.
+const char* GammaKey(const T_EVAL_D& eval, const T_PUSH_FACTORS& factors)
+{
+    if (eval.method >= PUSH_METHOD::Ntc2008) return "IDS_RPS_PO_CURVE_GAMMA_NTC";
+    return factors.eigenBased ? "IDS_RPS_PO_CURVE_GAMMA_FEMA" : "IDS_RPS_PO_CURVE_GAMMA_2D_FEMA";
+}
+
+T_DAMP_PARAM DampingOf(const T_EVAL_D& evaluation)
+{
+    T_DAMP_PARAM damping;
+    damping.behaviorType = evaluation.behavior.value_or(0);
+    damping.elasticPct = evaluation.elasticDamping.value_or(5.0);
+    if (const auto& u = evaluation.userDamping) {
+        damping.beta1 = (*u)[0];
+        damping.kappa1 = (*u)[1];
+        damping.beta2 = (*u)[2];
+        damping.kappa2 = (*u)[3];
+    }
+    return damping;
+}
+
+} // namespace
+
+CPushEvaluator::CPushEvaluator(CDBDoc& doc, PERFPT_PROCEDURE procedure)
+    : m_doc(doc), m_procedure(procedure), m_curve(doc)
+{
+}
+
+int CPushEvaluator::SetEvaluation(const T_EVAL_D& evaluation, T_FINDING& refusal)
+{
+    int pushover = 0, spectrum = 0;
+    T_SPFC_D record;
+    if (!m_doc.Attr().FindPolc(evaluation.push, pushover))
+        return Refuse(refusal, "push", "IDS_QM_PUSH_CASE_UNKNOWN", {evaluation.push});
+    if (!m_doc.Attr().FindSpfc(evaluation.spectrum, spectrum) ||
+        !m_doc.Attr().GetSpfc(spectrum, record))
+        return Refuse(refusal, "spectrum", "IDS_QM_PUSH_SPECTRUM_UNKNOWN", {evaluation.spectrum});
+    const std::vector<T_FINDING> wrong = OptionFindings(evaluation);
+    if (!wrong.empty()) {
+        refusal = wrong.front();
+        return 0;
+    }
+    m_eval = evaluation;
+    m_eval.masonry = evaluation.masonry.value_or(false) || ExistEC8OrMasonry();
+    m_spectrumRecord = record;
+    m_pushover = pushover;
+    SetDamping(DampingOf(evaluation));
+    SetAlphaInPercent(evaluation.alphaInPercent.value_or(false));
+    return 1;
+}
+
+double CPushEvaluator::FindGravity(bool fromSpectrum) const
+{
+    const auto* user = std::get_if<T_SPFC_USER>(&m_spectrumRecord.data);
+    if (fromSpectrum && user && user->gravity) return *user->gravity;
+    T_STYP_D styp;
+    if (m_doc.Attr().GetStyp(styp) && styp.gravity) return *styp.gravity;
+    return m_doc.Init().DefaultGravity();
+}
+
+void CPushEvaluator::Say(const char* key, std::initializer_list<std::string_view> values)
+{
+    m_result.messages.push_back({key, MMSGFunction::Format(key, values)});
+}
+
+int CPushEvaluator::Fail(PUSH_OUTCOME code, const char* key)
+{
+    m_result.outcome = {code, 0};
+    Say(key);
+    return 0;
+}
+
+T_PUSH_CURVE_SETTINGS CPushEvaluator::CurveSettings(PLOT_TYPE type) const
+{
+    T_PUSH_CURVE_SETTINGS settings;
+    settings.pushover = m_pushover;
+    settings.plotType = type;
+    settings.eigenFactors = m_eval.eigenFactors.value_or(true);
+    settings.gravity = FindGravity(true);
+    return settings;
+}
+
+int CPushEvaluator::CalcPushoverCurve()
+{
+    SetGravity(FindGravity(false), FindGravity(true));
+    const T_PUSH_CURVE_SETTINGS settings = CurveSettings(MethodPlotType());
+    const bool made = m_curveMade == settings && m_curveRevision == m_doc.Data().Revision();
+    m_curveMade.reset();
+    if (!made && !m_curve.Calc(settings)) {
+        SetCapacity({});
+        Say("IDS_QM_CURVE_NOT_READ", {m_eval.push, m_curve.Error()});
+        m_result.outcome = {PUSH_OUTCOME::NoCapacity, 0};
+        return 0;
+    }
+    m_curveMade = settings;
+    m_curveRevision = m_doc.Data().Revision();
+    if (IsSpectral(m_curve.PlotType())) {
+        if (!made) SetCapacity({m_curve.Displacement(), m_curve.Force()});
+    } else {
+        SetCapacity({});
+    }
+    WarnAboutCurve();
+    return CheckCurve();
+}
+
+// What makes a capacity spectrum impossible.
+int CPushEvaluator::CheckCurve()
+{
+    if (m_curve.PlotType() != MethodPlotType())
+        return Fail(PUSH_OUTCOME::ConversionFailed, "IDS_QM_VERTICAL_PUSH");
+    if (m_curve.NoEigen())
+        return Fail(PUSH_OUTCOME::NoEigen, "IDS_PUSHOVER_The_eigen_value_analysis_is_not_perfor");
+    if (IsTargetType(MethodPlotType()) && m_curve.EigenError())
+        return Fail(PUSH_OUTCOME::EigenError, "IDS_RPS_PO_CURVE_ERROR_EIGEN");
+    if (m_curve.ConversionError())
+        return Fail(PUSH_OUTCOME::ConversionFailed, "IDS_QM_NO_CONVERSION");
+    return 1;
+}
+
+void CPushEvaluator::WarnAboutCurve()
+{
+    if (m_curve.StoreyWithoutMass()) Say("IDS_RPS_ERROR_DIAPHRAGM_MASS");
+    if (const int step = m_curve.FirstDecreasingStep())
+        Say("IDS_QM_WARN_DECREASING_DISPLACEMENT", {m_eval.push, std::to_string(step)});
+}
+
+int CPushEvaluator::Evaluate()
+{
+    ClearPerfPoint();
+    m_result = {};
+    m_result.eval = m_eval;
+    m_result.procedure = m_eval.procedure.value_or('A');
+    m_result.units = m_doc.Unit().Units();
+    if (m_result.IsTarget())
+        m_result.limitStates = CPushOverTargetEvaluation::EmptyRows(m_eval.method);
+    SetGravity(FindGravity(false), FindGravity(true));
+    PrepareSpectrum();
+    if (CalcPushoverCurve()) {
+        m_result.result = m_result.IsTarget() ? UpdateTargetDispData() : UpdatePerformancePoint();
+    }
+    FillResult();
+    return m_result.result;
+}
+
+// The spectrum of the record at its own damping; NTC gives the state SLV here.
+void CPushEvaluator::PrepareSpectrum()
+{
+    const int behavior = Damping().behaviorType;
+    const double gravity = GetGravity(1);
+    if (m_spectrumMade == m_spectrumRecord && m_spectrumBehavior == behavior &&
+        m_spectrumGravity == gravity)
+        return;
+    SetDesignSpectrum(MakeDesignSpectrum(m_spectrumRecord, behavior, LIMIT_STATE::SLV));
+    m_spectrumMade = m_spectrumRecord;
+    m_spectrumBehavior = behavior;
+    m_spectrumGravity = gravity;
+}
+
+int CPushEvaluator::UpdatePerformancePoint()
+{
+    const char* const failed = "IDS_RPS_FAILED_FINDING_PERFORMANCE_POINT";
+    if (!DesignSpectrum()) return Fail(PUSH_OUTCOME::NoTrialPoint, failed);
+    const std::string& path = m_doc.Path();
+    SetModelPath(path.empty() ? path : CFileCtrl::GetFilePathAndNameWithoutExtension(path));
+    if (m_eval.method == PUSH_METHOD::Atc40 && Damping().behaviorType == kUserBehavior &&
+        !m_eval.userDamping)
+        Say("IDS_QM_WARN_NO_USER_DAMPING");
+    auto answer = m_procedure(m_eval.method, m_result.procedure - 'A', *this);
+    if (!answer) return Fail(PUSH_OUTCOME::NoCapacity, failed);
+    for (const std::string& key : Warnings())
+        Say(key.c_str());
+    m_result.trace = std::move(answer->trace);
+    m_result.locus = std::move(answer->locus);
+    m_result.outcome = answer->outcome;
+    if (answer->result == 0)
+        Say(failed);
+    else
+        m_result.point = MakePoint(answer->Sd, answer->Sa, answer->betaEff);
+    if (m_findAllPoints) KeepAllPoints();
+    return answer->result;
+}
+
+T_PERF_POINT CPushEvaluator::MakePoint(double Dp, double Ap, std::optional<double> beta) const
+{
+    T_PERF_POINT p;
+    p.Sd = p.D = Dp;
+    p.Sa = p.V = Ap;
+    TransferToDispAndReac(&p.D, &p.V);
+    p.Teff = SecantPeriod(Dp, Ap, GetGravity(1));
+    p.damping = beta;
+    return p;
+}
+
+// The procedure's answer stays as it is; the note says how it lies to the balanced points.
+void CPushEvaluator::KeepAllPoints()
+{
+    constexpr double kAway = 0.02; // of the point's displacement
+    const bool fema440 = m_eval.method == PUSH_METHOD::Fema440;
+    for (const T_BALANCED_POINT& b : CPushOverAllPoints(*this, fema440).Find())
+        m_result.allPoints.push_back(MakePoint(b.Sd, b.Sa, b.betaEff));
+    if (m_result.allPoints.empty()) return;
+    if (!m_result.point) {
+        m_result.pointNote = MMSGFunction::Format(
+            "IDS_QM_POINT_EXISTS", {std::to_string(m_result.allPoints.size()),
+                                    FormatText("%.6g", m_result.allPoints.front().D)});
+        return;
+    }
+    const double D = m_result.point->D;
+    const auto nearest = std::ranges::min_element(
+        m_result.allPoints, {}, [D](const T_PERF_POINT& p) { return std::fabs(p.D - D); });
+    const double away = std::fabs(nearest->D - D) / nearest->D;
+    if (away > kAway)
+        m_result.pointNote =
+            MMSGFunction::Format("IDS_QM_POINT_AWAY", {FormatText("%.2g", 100.0 * away),
+                                                       FormatText("%.6g", nearest->D)});
+}
+
+T_TARGET_INPUT CPushEvaluator::TargetInput(CStepDrift& drift) const
+{
+    T_TARGET_INPUT in;
+    in.capacity = Capacity();
+    in.gravity = GetGravity(1);
+    in.gamma = m_curve.Factors().gamma;
+    in.mStar = m_curve.Factors().mass * m_curve.Factors().alpha / in.gamma;
+    in.options = BilinearOptionsOf(m_eval);
+    in.drift = [&drift](int step) { return drift.Of(step); };
+    in.spectra = TargetSpectraOf(m_spectrumRecord, m_eval.method, Damping().behaviorType);
+    return in;
+}
+
+int CPushEvaluator::UpdateTargetDispData()
+{
+    const char* const failed = "IDS_RPS_FAILED_FINDING_TARGET_DISPLACEMENT";
+    CStepDrift drift(m_doc, m_pushover, m_eval.driftKind.value_or(1));
+    T_TARGET_INPUT input = TargetInput(drift);
+    const bool enabled = std::ranges::any_of(
+        input.spectra, [](const T_TARGET_SPECTRUM& s) { return static_cast<bool>(s.SaAt); });
+    if (!enabled) return Fail(PUSH_OUTCOME::NoTarget, failed);
+    CPushOverTargetEvaluation evaluation(std::move(input));
+    const int found = m_eval.method != PUSH_METHOD::Ec8Opcm
+                          ? evaluation.UpdateTargetDispDataNTC(m_eval.method)
+                      : m_result.IsMasonry() ? evaluation.UpdateTargetDispDataMasonry()
+                                             : evaluation.UpdateTargetDispDataEC8();
+    if (!found || evaluation.StrengthDropMissing()) Say(failed);
+    if (const char* const key = drift.WarningKey()) Say(key);
+    m_result.bilinear = evaluation.Bilinear();
+    m_result.targets = evaluation.Targets();
+    m_result.limitStates = evaluation.Rows();
+    m_result.guideLines = evaluation.GuideLines();
+    m_result.outcome = evaluation.Outcome();
+    if (m_storeSteps) StoreSteps(evaluation.DemandSteps());
+    return found;
+}
+
+void CPushEvaluator::StoreSteps(const std::vector<int>& steps)
+{
+    CPoverInfo* info = m_doc.Post().GetPoverInfo();
+    if (m_eval.method == PUSH_METHOD::Ec8Opcm)
+        info->SetStepEC8(m_pushover, steps[0], steps[1], steps[2]);
+    else // SLO is shown but never stored, on purpose
+        info->SetStepNTC2008(m_pushover, steps[1], steps[2], steps[3]);
+}
+
+void CPushEvaluator::FillResult()
+{
+    m_result.loadCase = m_curve.LoadCase();
+    m_result.factors = m_curve.Factors();
+    if (m_result.factors.gamma != 0.0)
+        m_result.mStar = m_result.factors.mass * m_result.factors.alpha / m_result.factors.gamma;
+    m_result.capacity = Capacity();
+    m_result.demand = Demand();
+    m_result.reduced = PerfPointSpectrum();
+    m_result.working = WorkingDemand();
+    if (m_result.locus.Sd.empty()) m_result.locus = PerfPointTrace();
+    m_result.gammaNote = MMSGFunction::GetValue(GammaKey(m_eval, m_result.factors));
+    KeepStateDemands();
+    m_result.teffs = Teffs();
+    PlotCurve();
+}
+
+// NTC: one spectrum for each enabled limit state, for the picture.
+void CPushEvaluator::KeepStateDemands()
+{
+    if (m_eval.method < PUSH_METHOD::Ntc2008 ||
+        !std::holds_alternative<T_SPFC_NTC>(m_spectrumRecord.data))
+        return;
+    m_result.stateDemands.resize(kLimitStateNames.size());
+    std::vector<double> T;
+    for (std::size_t i = 0; i < kLimitStateNames.size(); ++i) {
+        const auto spectrum = MakeDesignSpectrum(m_spectrumRecord, Damping().behaviorType,
+                                                 static_cast<LIMIT_STATE>(i));
+        if (!spectrum) continue;
+        T_ADRS_CURVE& curve = m_result.stateDemands[i];
+        spectrum->CalcPOSpectrumSRaSRv(1.0, 1.0, T, curve.Sa);
+        ToAdrs(T, curve.Sa, curve.Sd);
+    }
+}
+
+// The curve that the report tabulates: the method's own, or of the plot type asked for.
+void CPushEvaluator::PlotCurve()
+{
+    const auto type =
+        static_cast<PLOT_TYPE>(m_eval.plotType.value_or(static_cast<int>(m_eval.method)));
+    if (type == MethodPlotType()) {
+        if (m_curveMade)
+            m_result.curve = {m_curve.PlotType(), m_curve.Displacement(), m_curve.Force()};
+        return;
+    }
+    CPushOverCurveData data(m_doc);
+    const bool shear = type == PLOT_TYPE::ShearCoeff || type == PLOT_TYPE::Drift;
+    const int made = data.Calc(CurveSettings(type));
+    if (made && shear && data.Factors().weight == 0.0) Say("IDS_QM_WARN_NO_WEIGHT");
+    if (made) m_result.curve = {data.PlotType(), data.Displacement(), data.Force()};
+}
+
+bool CPushEvaluator::ExistEC8OrMasonry() const
+{
+    const auto isMasonry = [](const auto& entry) { return entry.second.masonry.has_value(); };
+    return std::ranges::any_of(m_doc.Data().Model().hingeTypes, isMasonry);
+}
+
+int CPushEvaluator::CalcAdditionalPerformancePoint(const std::string& spectrum, T_FINDING& refusal)
+{
+    if (m_result.additionalPoints.size() >= kMaxAdditional)
+        return Refuse(refusal, "", "IDS_RPS_PUSHOVER_Maxnum_reached");
+    if (m_result.IsTarget()) return Refuse(refusal, "", "IDS_QM_NO_ADDITIONAL_POINT");
+    CPushEvaluator other(m_doc, m_procedure);
+    other.SetFindAllPoints(false);
+    T_EVAL_D settings = m_eval;
+    settings.spectrum = spectrum;
+    if (!other.SetEvaluation(settings, refusal)) {
+        refusal.messageKey = "IDS_QM_SETTINGS";
+        return 0;
+    }
+    const int result = other.Evaluate();
+    m_result.additionalPoints.push_back(
+        {spectrum, result, other.Result().point, other.Result().outcome});
+    return 1;
+}
+
+void CPushEvaluator::ListStep(int step)
+{
+    const auto i = static_cast<std::size_t>(step);
+    const double Sd = m_result.capacity.Sd[i], Sa = m_result.capacity.Sa[i];
+    T_ADDITIONAL_STEP row{step, Sd, Sa, Sd, Sa};
+    TransferToDispAndReac(&row.D, &row.V);
+    m_result.additionalSteps.push_back(row);
+}

@@ -1,0 +1,34 @@
+// What a target-displacement evaluation reads from the model and from its settings.
+#pragma once
+
+#include "qm_rps/pushover/pushovertargetevaluation.h"
+
+/// Options of the bilinear curve: the rule's own, or the method's where none is named, with the
+/// fractions that the settings give.
+T_BILINEAR_OPTIONS BilinearOptionsOf(const T_EVAL_D& evaluation);
+
+/// The elastic spectra of the limit states: NTC has four, Eurocode 8 one. A state that the record
+/// does not enable stays empty.
+std::array<T_TARGET_SPECTRUM, 4> TargetSpectraOf(const T_SPFC_D& spectrum, PUSH_METHOD method,
+                                                 int behaviorType);
+
+/// Storey drift ratios of the steps of a load case, by the chosen kind; remembers what it met.
+class CStepDrift {
+public:
+    /// kind 1 or 2, see CPostCtrl. The document must outlive this object.
+    CStepDrift(CDBDoc& doc, int pushover, int kind) : m_doc(doc), m_pushover(pushover), m_kind(kind)
+    {
+    }
+
+    /// Ratio of a step; step 0 is the model at rest. Without storeys no drift limits the capacity:
+    /// 0 then, so that the peak step stands.
+    double Of(int step);
+
+    /// Key of the warning that belongs to what was read; null: none.
+    const char* WarningKey();
+
+private:
+    CDBDoc& m_doc;
+    int m_pushover, m_kind;
+    bool m_used = false, m_missing = false;
+};
