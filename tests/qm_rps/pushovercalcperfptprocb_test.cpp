@@ -65,13 +65,14 @@ TEST(PerfPtProcB, MatchesTheReferenceCalculation)
         double D, A, beta; // D = 0: no crossing
     };
     const T_POINTS example = Atc40ExampleCurve(), hard5 = Bilinear(10, 0.1, 0.05, 2000);
+    const T_DAMP_PARAM user{3, 5, 10, 0.9, 30, 0.5};
     const T_SPFC_ATC40 s4{0.4, 0.4, {}}, s6{0.6, 0.6, {}};
     // clang-format off
     const T_ROW rows[] = {
         {example, kExampleSd, {0}, 11, 109.3750941136, 0.350176887514, 23.7885953737},
         {example, kExampleSd, {1}, 11, 122.3617453570, 0.354542753509, 20.2437618668},
         {example, kExampleSd, {2}, 11, 151.1898434685, 0.364234213677, 14.5001738981},
-        {example, kExampleSd, {3, 5, 10, 0.9, 30, 0.5}, 11, 124.5640477594, 0.355283125834, 19.7086376971},
+        {example, kExampleSd, user, 11, 124.5640477594, 0.355283125834, 19.7086376971},
         {hard5,   s4,         {0}, 45,  75.3675997552, 0.132683799878, 37.1708977890},
         {hard5,   s4,         {1}, 45,  94.3337089150, 0.142166854458, 27.0164091547},
         {hard5,   s6,         {0}, 45,   0.0,          0.0,             0.0},

@@ -45,7 +45,7 @@ const T_FIT kFits[] = {
     // To 0.02: Sa = 0.25, area 0.001 + 0.00225, dy = 2 (0.02 - 0.013).
     { "ec8, between points",       kTrilinear, kEc8, 0.02, {0.014, 0.25, 0.05, 0.25} },
     // A curve below its chord (area 0.00705): dy = 2 (0.41 - 0.00705), limited to dm.
-    { "ec8, dy limited to dm",     {{0, 0.4, 0.41}, {0, 0.01, 1.0}}, kEc8, 0.41, {0.41, 1.0, 0.41, 1.0} },
+    { "ec8, dy at dm", {{0, 0.4, 0.41}, {0, 0.01, 1.0}}, kEc8, 0.41, {0.41, 1.0, 0.41, 1.0} },
     // 0.6 * 0.3 = 0.18 at 0.009: k = 20; area to the end 0.012.
     { "ntc, trilinear",            kTrilinear, kNtc, 0.0, Ntc(20, 0.05, 0.012) },
     // 0.24 on the second branch at 0.018.
@@ -55,7 +55,8 @@ const T_FIT kFits[] = {
     // Falls to 0.16 at 0.028; area 0.003 + 0.008 * 0.18.
     { "masonry, drop",             kSoft, kMasonry, 0.0, Ntc(20, 0.028, 0.00444) },
     // 0.18 is first reached at 0.01: k = 18; area 0.0009 + 0.0018 + 0.0024 + 0.006.
-    { "ntc, plateau at the level", {{0, 0.01, 0.02, 0.03, 0.05}, {0, 0.18, 0.18, 0.3, 0.3}}, kNtc, 0.0, Ntc(18, 0.05, 0.0111) },
+    { "ntc, level plateau", {{0, 0.01, 0.02, 0.03, 0.05}, {0, 0.18, 0.18, 0.3, 0.3}}, kNtc, 0.0,
+      Ntc(18, 0.05, 0.0111) },
     // k = 0.6, area 0.025 + 0.495 + 0.08 = 0.6 > k du2/2: no real root, the peak is taken.
     { "ntc, no root",              kKnuckle, kNtc, 0.0, {1.0 / 0.6, 1.0, 1.1, 1.0} },
 };

@@ -42,18 +42,20 @@ struct T_FACTOR_CASE {
     bool eigenBased, eigenError, conversionError, massError;
 };
 
+constexpr bool Y = true, n = false;
+using enum PLOT_TYPE;
 // clang-format off
 const T_FACTOR_CASE kFactorCases[] = {
     // largest participation; the third mode is equal, not larger
-    { "eigen",             0, {},     P::Atc40,   true,  kGamma, kAlpha, 2, true,  false, false, true },
-    { "mass",              0, {},     P::Atc40,   false, kGamma, kAlpha, 2, false, false, false, false },
-    { "named",             2, {3, 1}, P::Ec8Opcm, true,  kGamma, kAlpha, 3, true,  false, false, true },
-    { "named, other way",  2, {1},    P::Ec8Opcm, true,  0.0,    0.0,    1, true,  true,  true,  true },
-    { "named, no such",    2, {9},    P::Atc40,   true,  0.0,    0.0,    0, true,  true,  true,  true },
-    { "uniform, target",   1, {},     P::Ec8Opcm, true,  1.0,    1.0,    2, false, false, false, false },
-    { "uniform, ATC-40",   1, {},     P::Atc40,   true,  kGamma, kAlpha, 2, true,  false, false, true },
-    { "uniform, FEMA 440", 1, {},     P::Fema440, false, 1.0,    1.0,    2, false, false, false, false },
-    { "not spectral",      0, {},     P::Drift,   false, 0.0,    0.0,    2, false, false, false, true },
+    { "eigen",             0, {},     Atc40,   Y, kGamma, kAlpha, 2, Y, n, n, Y },
+    { "mass",              0, {},     Atc40,   n, kGamma, kAlpha, 2, n, n, n, n },
+    { "named",             2, {3, 1}, Ec8Opcm, Y, kGamma, kAlpha, 3, Y, n, n, Y },
+    { "named, other way",  2, {1},    Ec8Opcm, Y, 0.0,    0.0,    1, Y, Y, Y, Y },
+    { "named, no such",    2, {9},    Atc40,   Y, 0.0,    0.0,    0, Y, Y, Y, Y },
+    { "uniform, target",   1, {},     Ec8Opcm, Y, 1.0,    1.0,    2, n, n, n, n },
+    { "uniform, ATC-40",   1, {},     Atc40,   Y, kGamma, kAlpha, 2, Y, n, n, Y },
+    { "uniform, FEMA 440", 1, {},     Fema440, n, 1.0,    1.0,    2, n, n, n, n },
+    { "not spectral",      0, {},     Drift,   n, 0.0,    0.0,    2, n, n, n, Y },
 };
 // clang-format on
 
