@@ -87,5 +87,5 @@ void CCaseGet::OptElements(const char* key, std::vector<int>& ids)
 
 void CCaseGet::FailRef(CJsonReader& in, RECORD_KIND kind)
 {
-    WithKind(kind, [&](const auto& row) { in.Fail(std::string("there is no such ") + row.noun); });
+    WithKind(kind, [&](const auto& row) { in.Fail("there is no such " + std::string(row.noun)); });
 }

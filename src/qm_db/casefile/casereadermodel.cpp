@@ -103,7 +103,7 @@ public:
         Read(row);
         if constexpr (std::is_same_v<R, T_LCOM_D>)
             CheckCycles(m_root, m_model);
-        else if (row.noun)
+        else if (!row.noun.empty())
             AddNames(m_model.*row.table, m_names);
     }
 

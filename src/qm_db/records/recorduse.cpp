@@ -49,7 +49,7 @@ T_RECORD_USERS UsersOf(const T_MODEL& model, RECORD_KIND kind, int key)
     const std::string name = named ? *named : std::string();
     T_RECORD_USERS users;
     ForEachKind([&]<class R>(const T_RECORD_ROW<R>& row) {
-        if (!row.user) return;
+        if (row.user.empty()) return;
         for (const auto& [k, record] : model.*row.table) {
             CRefersTo look(kind, key, name);
             CaseFields(look, record);

@@ -4,6 +4,7 @@
 
 #include "qm_db/records.h"
 
+#include <string_view>
 #include <tuple>
 
 /// How the case file gives the key of a record: it counts 1, 2, 3, ... and is stated where it does
@@ -16,20 +17,20 @@ struct T_RECORD_ROW {
     const char* store;  // table of the model file
     const char* member; // of the case file; null: it stands in another record
     CASE_KEY key;
-    const char* noun; // "there is no such ..."; null: other records do not refer to it
+    std::string_view noun; // "there is no such ..."; empty: other records do not refer to it
     /// As a record that refers to others: its place among the kinds in a message, and what it is
-    /// called there; null: it refers to none.
+    /// called there; empty: it refers to none.
     int place = 0;
-    const char* user = nullptr;
+    std::string_view user = "";
 };
 
 // clang-format off
 /// In the order of the case file: a record refers to those of rows above, and of its own.
 inline constexpr std::tuple kRecords{
     T_RECORD_ROW<T_NODE_D>{&T_MODEL::nodes, "nodes", "nodes", CASE_KEY::Member, "node"},
-    T_RECORD_ROW<T_STOR_D>{&T_MODEL::storeys, "storeys", "storeys", CASE_KEY::Counted, nullptr,
+    T_RECORD_ROW<T_STOR_D>{&T_MODEL::storeys, "storeys", "storeys", CASE_KEY::Counted, "",
                            7, "IDS_QM_DB_USER_STOREY"},
-    T_RECORD_ROW<T_EIGV_D>{&T_MODEL::modes, "modes", "modes", CASE_KEY::Counted, nullptr},
+    T_RECORD_ROW<T_EIGV_D>{&T_MODEL::modes, "modes", "modes", CASE_KEY::Counted, ""},
     T_RECORD_ROW<T_MATL_D>{&T_MODEL::materials, "materials", "materials",
                            CASE_KEY::Stated, "material"},
     T_RECORD_ROW<T_SECT_D>{&T_MODEL::sections, "sections", "sections",
@@ -37,9 +38,9 @@ inline constexpr std::tuple kRecords{
     T_RECORD_ROW<T_ELEM_D>{&T_MODEL::elements, "elements", "elements",
                            CASE_KEY::Member, "element", 1, "IDS_QM_DB_USER_ELEMENT"},
     T_RECORD_ROW<T_DIAP_D>{&T_MODEL::diaphragms, "diaphragms", "diaphragms",
-                           CASE_KEY::Stated, nullptr, 2, "IDS_QM_DB_USER_DIAPHRAGM"},
+                           CASE_KEY::Stated, "", 2, "IDS_QM_DB_USER_DIAPHRAGM"},
     T_RECORD_ROW<T_EQDS_D>{&T_MODEL::equalDisplacements, "equal_displacements",
-                           "equal_displacements", CASE_KEY::Stated, nullptr,
+                           "equal_displacements", CASE_KEY::Stated, "",
                            3, "IDS_QM_DB_USER_EQUAL"},
     T_RECORD_ROW<T_STLD_D>{&T_MODEL::loadCases, "load_cases", "load_cases",
                            CASE_KEY::Stated, "load case", 4, "IDS_QM_DB_USER_LOAD_CASE"},
@@ -50,24 +51,24 @@ inline constexpr std::tuple kRecords{
     T_RECORD_ROW<T_ULFC_D>{&T_MODEL::ulfConstraints, "ulf_constraints", "ulf_constraints",
                            CASE_KEY::Stated, "constraint", 11, "IDS_QM_DB_USER_ULF_CONSTRAINT"},
     T_RECORD_ROW<T_ULFI_D>{&T_MODEL::ulfItems, "ulf_items", "ulf_items",
-                           CASE_KEY::Stated, nullptr, 6, "IDS_QM_DB_USER_ULF_ITEM"},
+                           CASE_KEY::Stated, "", 6, "IDS_QM_DB_USER_ULF_ITEM"},
     T_RECORD_ROW<T_ULSI_D>{&T_MODEL::ulfStageItems, "ulf_stage_items", "ulf_stage_items",
-                           CASE_KEY::Stated, nullptr, 13, "IDS_QM_DB_USER_ULF_STAGE_ITEM"},
+                           CASE_KEY::Stated, "", 13, "IDS_QM_DB_USER_ULF_STAGE_ITEM"},
     T_RECORD_ROW<T_POFC_D>{&T_MODEL::incrementFunctions, "increment_functions",
-                           "increment_functions", CASE_KEY::Stated, nullptr},
+                           "increment_functions", CASE_KEY::Stated, ""},
     T_RECORD_ROW<T_PHGT_D>{&T_MODEL::hingeTypes, "hinge_types", "hinge_types",
                            CASE_KEY::Stated, "hinge type", 9, "IDS_QM_DB_USER_HINGE_TYPE"},
-    T_RECORD_ROW<T_PHGE_D>{&T_MODEL::hinges, "hinges", "hinges", CASE_KEY::Stated, nullptr,
+    T_RECORD_ROW<T_PHGE_D>{&T_MODEL::hinges, "hinges", "hinges", CASE_KEY::Stated, "",
                            8, "IDS_QM_DB_USER_HINGE"},
     T_RECORD_ROW<T_IEHP_D>{&T_MODEL::inelasticHinges, "inelastic_hinges", "inelastic_hinges",
-                           CASE_KEY::Stated, nullptr},
+                           CASE_KEY::Stated, ""},
     T_RECORD_ROW<T_SPFC_D>{&T_MODEL::spectra, "spectra", "spectra", CASE_KEY::Counted, "spectrum"},
     T_RECORD_ROW<T_POLC_D>{&T_MODEL::pushovers, "pushovers", "pushover",
                            CASE_KEY::Counted, "pushover load case", 10, "IDS_QM_DB_USER_PUSHOVER"},
     T_RECORD_ROW<T_POVR_D>{&T_MODEL::poverSteps, "limit_state_steps", nullptr,
-                           CASE_KEY::Counted, nullptr},
+                           CASE_KEY::Counted, ""},
     T_RECORD_ROW<T_EVAL_D>{&T_MODEL::evaluations, "evaluations", "evaluations",
-                           CASE_KEY::Counted, nullptr, 14, "IDS_QM_DB_USER_EVALUATION"}};
+                           CASE_KEY::Counted, "", 14, "IDS_QM_DB_USER_EVALUATION"}};
 // clang-format on
 
 /// A kind of record: the number of its row.

@@ -6,6 +6,8 @@
 #include "qm_db/records/fieldwords.h"
 #include "qm_db/store/modelschema.h"
 
+#include <utility>
+
 /// Owner in "arrays" of the texts of a table that has no column for them.
 std::string TextOwner(const std::string& table);
 
