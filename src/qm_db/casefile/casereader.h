@@ -15,7 +15,8 @@ class CCaseNames;
 /// What a load case has beside its own members: results of another solver, limit-state steps.
 void ReadSteps(CJsonReader& in, const CCaseNames& names, const std::string& folder, int key,
                const T_POLC_D& push, T_MODEL_CONTENT& content);
-void ReadEvaluations(CJsonReader& root, T_MODEL& model);
+/// References by name, and rules of the record.
+void JudgeEvaluation(CJsonReader& in, const T_MODEL& model, const T_EVAL_D& eval);
 
 /// "steps" of one load case, in SI.
 void ReadSteps(CJsonReader& steps, const std::string& folder, const T_MODEL& model,

@@ -19,73 +19,19 @@ void Judge(CJsonReader& in, std::string_view key, const T_EVAL_D& eval)
     if (const char* const reason = EvaluationFault(eval, key)) in.FailAt(key, reason);
 }
 
-template <class T>
-void GetJudged(CJsonReader& in, std::string_view key, std::optional<T>& out, const T_EVAL_D& eval)
-{
-    in.Get(key, out);
-    Judge(in, key, eval);
-}
-
-void ReadProcedure(CJsonReader& in, T_EVAL_D& eval)
-{
-    if (!in.Has("procedure")) return;
-    const auto offered = ProceduresOf(eval.method);
-    if (offered.empty()) return in.FailAt("procedure", "only ATC-40 and FEMA440 have procedures");
-    eval.procedure =
-        *offered[static_cast<std::size_t>(in.Choice("procedure", offered, "procedure"))];
-}
-
-void ReadBilinear(CJsonReader in, T_EVAL_D& eval)
-{
-    T_EVAL_BILINEAR& bilinear = eval.bilinear.emplace();
-    in.Keys({"rule", "secant", "drop", "iterate"});
-    if (in.Has("rule"))
-        bilinear.rule = kBilinearRules[static_cast<std::size_t>(
-            in.Choice("rule", kBilinearRules, "bilinear rule"))];
-    GetJudged(in, "secant", bilinear.secant, eval);
-    GetJudged(in, "drop", bilinear.drop, eval);
-    in.Get("iterate", bilinear.iterate);
-}
-
-void ReadReferences(CJsonReader& in, const T_MODEL& model, T_EVAL_D& eval)
-{
-    in.Get("push", eval.push);
-    if (!HasName(model.pushovers, eval.push))
-        in.FailAt("push", "there is no pushover load case " + QuotedText(eval.push));
-    in.Get("spectrum", eval.spectrum);
-    if (!HasName(model.spectra, eval.spectrum))
-        in.FailAt("spectrum", "there is no spectrum " + QuotedText(eval.spectrum));
-}
-
-void ReadEvaluation(CJsonReader& in, int key, T_MODEL& model, std::set<std::string>& taken)
-{
-    T_EVAL_D eval;
-    in.Keys({"name", "push", "method", "procedure", "spectrum", "behavior", "elastic_damping",
-             "user_damping", "eigen_factors", "masonry", "drift_kind", "plot_type",
-             "alpha_in_percent", "bilinear"});
-    in.GetName("name", eval.name, taken);
-    ReadReferences(in, model, eval);
-    eval.method =
-        static_cast<PUSH_METHOD>(kFirstMethod + in.Choice("method", kMethodNames, "method"));
-    ReadProcedure(in, eval);
-    GetJudged(in, "behavior", eval.behavior, eval);
-    GetJudged(in, "elastic_damping", eval.elasticDamping, eval);
-    GetJudged(in, "user_damping", eval.userDamping, eval);
-    in.Get("eigen_factors", eval.eigenFactors);
-    in.Get("masonry", eval.masonry);
-    GetJudged(in, "drift_kind", eval.driftKind, eval);
-    GetJudged(in, "plot_type", eval.plotType, eval);
-    in.Get("alpha_in_percent", eval.alphaInPercent);
-    if (in.Has("bilinear")) ReadBilinear(in.Member("bilinear"), eval);
-    model.evaluations[key] = std::move(eval);
-}
-
 } // namespace
 
-void ReadEvaluations(CJsonReader& root, T_MODEL& model)
+void JudgeEvaluation(CJsonReader& in, const T_MODEL& model, const T_EVAL_D& eval)
 {
-    std::set<std::string> taken;
-    ForEachRecord(root, "evaluations", [&](CJsonReader& item, std::size_t index) {
-        ReadEvaluation(item, static_cast<int>(index) + 1, model, taken);
-    });
+    if (!HasName(model.pushovers, eval.push))
+        in.FailAt("push", "there is no pushover load case " + QuotedText(eval.push));
+    if (!HasName(model.spectra, eval.spectrum))
+        in.FailAt("spectrum", "there is no spectrum " + QuotedText(eval.spectrum));
+    for (const char* const key :
+         {"behavior", "elastic_damping", "user_damping", "drift_kind", "plot_type"})
+        Judge(in, key, eval);
+    if (!eval.bilinear) return;
+    CJsonReader bilinear = in.Member("bilinear");
+    for (const char* const key : {"secant", "drop"})
+        Judge(bilinear, key, eval);
 }

@@ -123,7 +123,13 @@ private:
                   });
     }
     void Read(const T_RECORD_ROW<T_POVR_D>&) {}
-    void Read(const T_RECORD_ROW<T_EVAL_D>&) { ReadEvaluations(m_root, m_model); }
+    void Read(const T_RECORD_ROW<T_EVAL_D>& row)
+    {
+        ReadTable(m_root, m_names, row, m_model, {},
+                  [&](CJsonReader& in, int, const T_EVAL_D& eval) {
+                      JudgeEvaluation(in, m_model, eval);
+                  });
+    }
 
     CJsonReader& m_root;
     const std::string& m_folder;

@@ -1,6 +1,7 @@
 // Members of the records of pushover load cases, spectra and evaluations; see fieldwords.h.
 #pragma once
 
+#include "qm_db/records/evaluationrules.h"
 #include "qm_db/records/structfields.h"
 
 #include <utility>
@@ -150,10 +151,12 @@ void CaseFields(V& v, T_FIELD_REF<V, T_SPFC_USER> r)
     const auto isAscending = [&](double T) { return T > std::exchange(before, T); };
     v.Need("T", r.T);
     v.Check("T", r.T.size() >= 2, "a spectrum needs at least 2 points");
-    v.CheckEach("T", r.T, isNotNegative, "a period can't be negative");
-    v.CheckEach("T", r.T, isAscending, "periods must ascend");
     v.Need("Sa", r.Sa);
-    v.CheckEach("Sa", r.Sa, isNotNegative, "Sa can't be negative");
+    if (r.Sa.size() == r.T.size()) { // else the table of spectra says so
+        v.CheckEach("T", r.T, isNotNegative, "a period can't be negative");
+        v.CheckEach("T", r.T, isAscending, "periods must ascend");
+        v.CheckEach("Sa", r.Sa, isNotNegative, "Sa can't be negative");
+    }
     v.OptIf("gravity", r.gravity, kDimAccel);
     v.Check("gravity", r.gravity.value_or(1.0) > 0.0, "gravity must be above 0");
 }
@@ -181,7 +184,10 @@ void CaseFields(V& v, T_FIELD_REF<V, T_EVAL_D> r)
 {
     v.NameRef("push", r.push, KindOf<T_POLC_D>());
     v.template Enum<kFirstMethod>("method", r.method, kMethodNames, "method");
-    v.LetterIf("procedure", r.procedure, kProcedures, "procedure");
+    const std::span<const char* const> offered = ProceduresOf(r.method);
+    v.Check("procedure", !offered.empty(), "only ATC-40 and FEMA440 have procedures");
+    v.LetterIf("procedure", r.procedure,
+               offered.empty() ? std::span<const char* const>(kProcedures) : offered, "procedure");
     v.NameRef("spectrum", r.spectrum, KindOf<T_SPFC_D>());
     v.OptIf("behavior", r.behavior);
     v.OptIf("elastic_damping", r.elasticDamping);
