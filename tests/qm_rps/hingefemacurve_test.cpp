@@ -20,91 +20,102 @@ std::vector<T_FINDING> FindingsOf(const F& f, int component = 0)
     return out;
 }
 
-struct T_CASE {
-    const char* rule; // first finding; empty: none
-    void (*spoil)(F&);
+/// A curve and its sides, to be spoiled.
+struct X {
+    F f = ValidBackbone<F>();
+    T_SKEL_SIDE &p = f.sides.pos, &n = f.sides.neg;
 };
 
-// Each rule just outside and just inside its bound.
+struct T_CASE {
+    const char* rule; // first finding; empty: none
+    void (*spoil)(X&);
+};
+
+// Each rule just outside and just inside its bound; the negative side mirrors the positive one.
 // clang-format off
 const T_CASE kCases[] = {
-    { "F(B) > 0",   [](F& f) { f.sides.pos.B.strength = 0; } },
-    { "",           [](F& f) { f.sides.pos.B.strength = 1e-12; } },
-    { "D(B) > 0",   [](F& f) { f.sides.pos.B.deform = 0; } },
-    { "",           [](F& f) { f.sides.pos.B.deform = 0; f.measure = SKEL_MEASURE::Plastic; } },
-    { "F(C) > 0",   [](F& f) { f.sides.pos.C.strength = 0; } },
-    { "F(D) >= 0",  [](F& f) { f.sides.pos.D.strength = -1e-12; } },
-    { "",           [](F& f) { // many at their bounds at once
-        f.sides.pos.D.strength = f.sides.pos.E.strength = f.sides.neg.D.strength = f.sides.neg.E.strength = 0;
-        f.sides.pos.IO = 4, f.sides.neg.IO = -3, f.dcRatio = T_SIDES<double>{0, 1}, f.unloadProportion = 1; } },
-    { "F(-B) < 0",  [](F& f) { f.sides.neg.B.strength = 0; } },
-    { "D(-B) < 0",  [](F& f) { f.sides.neg.B.deform = 0; } },
-    { "F(-C) < 0",  [](F& f) { f.sides.neg.C.strength = 0; } },
-    { "F(-D) <= 0", [](F& f) { f.sides.neg.D.strength = 1e-12; } },
-    { "F(-E) <= 0", [](F& f) { f.sides.neg.E.strength = 1e-12; } },
-    { "D(B) <  D(C)",  [](F& f) { f.sides.pos.C.deform = 1; } },
-    { "",              [](F& f) { f.sides.pos.C.deform = 1; f.sides.pos.C.strength = 1; } },
-    { "D(B) <= D(C)",  [](F& f) { f.sides.pos.C.deform = 0.999; f.sides.pos.C.strength = 1; } },
-    { "D(C) <= D(D) <= D(E)", [](F& f) { f.sides.pos.D.deform = 5.999; } },
-    { "D(C) <= D(D) <= D(E)", [](F& f) { f.sides.pos.D.deform = 8.001; } },
-    { "D(D) <  D(E)",  [](F& f) { f.sides.pos.E.deform = 6; } },
-    { "",              [](F& f) { f.sides.pos.E.deform = 6; f.sides.pos.E.strength = 0.1; } },
-    { "F(B) <= F(C)",  [](F& f) { f.sides.pos.C.strength = 0.999; } },
-    { "F(D) <  F(C)",  [](F& f) { f.sides.pos.D.strength = 1.2; } },
-    { "",              [](F& f) { f.sides.pos.D.strength = 1.199; } },
-    { "F(E) <= F(D)",  [](F& f) { f.sides.pos.E.strength = 0.201; } },
-    { "F(E) = F(D)",   [](F& f) { f.strengthLoss = false; f.sides.pos.E.strength = 0.199; } },
-    { "",              [](F& f) { f.strengthLoss = false; f.sides.pos.D.strength = f.sides.pos.E.strength = 1.2; } },
-    { "D(-C) < D(-B)", [](F& f) { f.sides.neg.C.deform = -1; } },
-    { "D(-C) <= D(-B)", [](F& f) { f.sides.neg.C.deform = -0.999; f.sides.neg.C.strength = -1; } },
-    { "D(-E) <=  D(-D) <= D(-C)", [](F& f) { f.sides.neg.D.deform = -4.999; } },
-    { "D(-E) <=  D(-D) <= D(-C)", [](F& f) { f.sides.neg.D.deform = -7.001; } },
-    { "D(-E) <  D(-D)", [](F& f) { f.sides.neg.E.deform = -5; } },
-    { "F(-C) <= F(-B)", [](F& f) { f.sides.neg.C.strength = -0.999; } },
-    { "F(-C) <  F(-D)", [](F& f) { f.sides.neg.D.strength = -1.3; } },
-    { "F(-D) <= F(-E)", [](F& f) { f.sides.neg.E.strength = -0.301; } },
-    { "F(-E) = F(-D)",  [](F& f) { f.strengthLoss = false; f.sides.neg.E.strength = -0.299; } },
-    { "IO <= LS",  [](F& f) { f.sides.pos.IO = 4.001; } },
-    { "IO <= LS",  [](F& f) { f.sides.neg.IO = -3.001; } },
-    { "LS <= CP",  [](F& f) { f.sides.pos.LS = 6.001; } },
-    { "LS <= CP",  [](F& f) { f.sides.neg.CP = -2.999; } },
-    { "IDS_RPS_Error_Pushove_Hinge_Properties_DC_RATIO", [](F& f) { f.dcRatio = T_SIDES<double>{-0.001, 1}; } },
-    { "IDS_RPS_Error_Pushove_Hinge_Properties_DC_RATIO", [](F& f) { f.dcRatio = T_SIDES<double>{0, 1.001}; } },
-    { "IDS_RPS_PO_FEMA_Yield_FY_P", [](F& f) { f.sides.pos.yield = 0; } },
-    { "IDS_RPS_PO_FEMA_Yield_FY_M", [](F& f) { f.sides.neg.yield = 0; } },
-    { "",                           [](F& f) { f.sides.pos.yield = 0; f.autoYield = true; } },
-    { "IDS_RPS_PO_PHGT_Initial_Stiffness", [](F& f) { f.sides.pos.userStiffness = -0.001; } },
-    { "",                                  [](F& f) { f.sides.pos.userStiffness = 0; f.sides.neg.userStiffness = -1; } },
-    { "IDS_RPS_PO_PHGT_Initial_Stiffness", [](F& f) { f.asymStiffness = true; f.sides.neg.userStiffness = -0.001; } },
-    { "",                                  [](F& f) { f.initStiffness = INIT_STIFFNESS::EI6L; f.sides.pos.userStiffness = -1; } },
-    { "IDS_RPS_PO_PHGT_UNLOADING_EXP", [](F& f) { f.unloadExponent = -0.001; } },
-    { "IDS_RPS_PO_PHGT_UNLOADING_PRF", [](F& f) { f.unloadProportion = -0.001; } },
-    { "IDS_RPS_PO_PHGT_UNLOADING_PRF", [](F& f) { f.unloadProportion = 1.001; } },
-    { "",           [](F& f) { f.energyBased = true; f.unloadFactor = -1; } },
-    { "",           [](F& f) { f.energyBased = true; f.unloadFactor = 1; f.sides.pos.energy = {}; } },
-    { "A~B >= 0.0", [](F& f) { f.energyBased = true; f.sides.pos.energy[0] = -0.001; } },
-    { "A~B >= 0.0", [](F& f) { f.energyBased = true; f.sides.neg.energy[0] = -0.001; f.sides.pos.energy[1] = 2; } },
-    { "C >= D",     [](F& f) { f.energyBased = true; f.sides.pos.energy[2] = 0.751; } },
-    { "D >= E",     [](F& f) { f.energyBased = true; f.sides.pos.energy[3] = 0.501; } },
-    { "E >= 0.0",   [](F& f) { f.energyBased = true; f.sides.pos.energy[3] = -0.001; } },
-    { "A~B >= C",   [](F& f) { f.energyBased = true; f.sides.neg.energy[1] = 1.001; } },
-    { "-1.0 <= Unloading Stiffness Factor <= 1.0", [](F& f) { f.energyBased = true; f.unloadFactor = 1.001; } },
-    { "-1.0 <= Unloading Stiffness Factor <= 1.0", [](F& f) { f.energyBased = true; f.unloadFactor = -1.001; } },
-    { "F(B) > 0",   [](F& f) { f.sides.pos.B.strength = kNan; } },
-    { "D(C) <= D(D) <= D(E)", [](F& f) { f.sides.pos.E.deform = kNan; f.sides.pos.E.strength = 0.1; } },
-    { "",           [](F& f) { f.symmetric = true; f.sides.neg = {}; } }, // mirrored, not entered
-    { "IDS_RPS_MULTI_CURVE_COUNT", [](F& f) { f.multiCurve = true; f.curves = {{0, f.sides}}; f.curves[0].sides.pos.B.strength = 0; } },
-    { "F(B) > 0",   [](F& f) { f.multiCurve = true; f.curves = {{0, f.sides}, {5, f.sides}}; f.curves[1].sides.pos.B.strength = 0; } },
-    { "Axial Force 5 already exists!", [](F& f) { f.multiCurve = true; f.curves = {{5, f.sides}, {5, f.sides}}; } },
+    { "F(B) > 0",   [](X& x) { x.p.B.strength = 0; } },
+    { "",           [](X& x) { x.p.B.strength = 1e-12; } },
+    { "D(B) > 0",   [](X& x) { x.p.B.deform = 0; } },
+    { "",           [](X& x) { x.p.B.deform = 0; x.f.measure = SKEL_MEASURE::Plastic; } },
+    { "F(C) > 0",   [](X& x) { x.p.C.strength = 0; } },
+    { "F(D) >= 0",  [](X& x) { x.p.D.strength = -1e-12; } },
+    { "",           [](X& x) { // many at their bounds at once
+        x.p.D.strength = x.p.E.strength = x.n.D.strength = x.n.E.strength = 0;
+        x.p.IO = 4, x.n.IO = -3, x.f.dcRatio = T_SIDES<double>{0, 1}, x.f.unloadProportion = 1; } },
+    { "F(-B) < 0",  [](X& x) { x.n.B.strength = 0; } },
+    { "F(-E) <= 0", [](X& x) { x.n.E.strength = 1e-12; } },
+    { "D(B) <  D(C)",  [](X& x) { x.p.C.deform = 1; } },
+    { "",              [](X& x) { x.p.C.deform = 1; x.p.C.strength = 1; } },
+    { "D(B) <= D(C)",  [](X& x) { x.p.C.deform = 0.999; x.p.C.strength = 1; } },
+    { "D(C) <= D(D) <= D(E)", [](X& x) { x.p.D.deform = 5.999; } },
+    { "D(C) <= D(D) <= D(E)", [](X& x) { x.p.D.deform = 8.001; } },
+    { "D(D) <  D(E)",  [](X& x) { x.p.E.deform = 6; } },
+    { "",              [](X& x) { x.p.E.deform = 6; x.p.E.strength = 0.1; } },
+    { "F(B) <= F(C)",  [](X& x) { x.p.C.strength = 0.999; } },
+    { "F(D) <  F(C)",  [](X& x) { x.p.D.strength = 1.2; } },
+    { "",              [](X& x) { x.p.D.strength = 1.199; } },
+    { "F(E) <= F(D)",  [](X& x) { x.p.E.strength = 0.201; } },
+    { "F(E) = F(D)",   [](X& x) { x.f.strengthLoss = false; x.p.E.strength = 0.199; } },
+    { "",
+      [](X& x) { x.f.strengthLoss = false; x.p.D.strength = x.p.E.strength = 1.2; } },
+    { "D(-C) < D(-B)", [](X& x) { x.n.C.deform = -1; } },
+    { "D(-E) <=  D(-D) <= D(-C)", [](X& x) { x.n.D.deform = -4.999; } },
+    { "F(-C) <= F(-B)", [](X& x) { x.n.C.strength = -0.999; } },
+    { "F(-E) = F(-D)",  [](X& x) { x.f.strengthLoss = false; x.n.E.strength = -0.299; } },
+    { "IO <= LS",  [](X& x) { x.p.IO = 4.001; } },
+    { "IO <= LS",  [](X& x) { x.n.IO = -3.001; } },
+    { "LS <= CP",  [](X& x) { x.p.LS = 6.001; } },
+    { "IDS_RPS_Error_Pushove_Hinge_Properties_DC_RATIO",
+      [](X& x) { x.f.dcRatio = T_SIDES<double>{-0.001, 1}; } },
+    { "IDS_RPS_Error_Pushove_Hinge_Properties_DC_RATIO",
+      [](X& x) { x.f.dcRatio = T_SIDES<double>{0, 1.001}; } },
+    { "IDS_RPS_PO_FEMA_Yield_FY_P", [](X& x) { x.p.yield = 0; } },
+    { "IDS_RPS_PO_FEMA_Yield_FY_M", [](X& x) { x.n.yield = 0; } },
+    { "",                           [](X& x) { x.p.yield = 0; x.f.autoYield = true; } },
+    { "IDS_RPS_PO_PHGT_Initial_Stiffness", [](X& x) { x.p.userStiffness = -0.001; } },
+    { "",
+      [](X& x) { x.p.userStiffness = 0; x.n.userStiffness = -1; } },
+    { "IDS_RPS_PO_PHGT_Initial_Stiffness",
+      [](X& x) { x.f.asymStiffness = true; x.n.userStiffness = -0.001; } },
+    { "",
+      [](X& x) { x.f.initStiffness = INIT_STIFFNESS::EI6L; x.p.userStiffness = -1; } },
+    { "IDS_RPS_PO_PHGT_UNLOADING_EXP", [](X& x) { x.f.unloadExponent = -0.001; } },
+    { "IDS_RPS_PO_PHGT_UNLOADING_PRF", [](X& x) { x.f.unloadProportion = -0.001; } },
+    { "IDS_RPS_PO_PHGT_UNLOADING_PRF", [](X& x) { x.f.unloadProportion = 1.001; } },
+    { "",           [](X& x) { x.f.energyBased = true; x.f.unloadFactor = -1; } },
+    { "",           [](X& x) { x.f.energyBased = true; x.f.unloadFactor = 1; x.p.energy = {}; } },
+    { "A~B >= 0.0", [](X& x) { x.f.energyBased = true; x.p.energy[0] = -0.001; } },
+    { "A~B >= 0.0",
+      [](X& x) { x.f.energyBased = true; x.n.energy[0] = -0.001; x.p.energy[1] = 2; } },
+    { "C >= D",     [](X& x) { x.f.energyBased = true; x.p.energy[2] = 0.751; } },
+    { "D >= E",     [](X& x) { x.f.energyBased = true; x.p.energy[3] = 0.501; } },
+    { "E >= 0.0",   [](X& x) { x.f.energyBased = true; x.p.energy[3] = -0.001; } },
+    { "A~B >= C",   [](X& x) { x.f.energyBased = true; x.n.energy[1] = 1.001; } },
+    { "-1.0 <= Unloading Stiffness Factor <= 1.0",
+      [](X& x) { x.f.energyBased = true; x.f.unloadFactor = 1.001; } },
+    { "-1.0 <= Unloading Stiffness Factor <= 1.0",
+      [](X& x) { x.f.energyBased = true; x.f.unloadFactor = -1.001; } },
+    { "F(B) > 0",   [](X& x) { x.p.B.strength = kNan; } },
+    { "D(C) <= D(D) <= D(E)", [](X& x) { x.p.E.deform = kNan; x.p.E.strength = 0.1; } },
+    { "",           [](X& x) { x.f.symmetric = true; x.n = {}; } }, // mirrored, not entered
+    { "IDS_RPS_MULTI_CURVE_COUNT",
+      [](X& x) { x.f.multiCurve = true; x.f.curves = {{0, x.f.sides}};
+        x.f.curves[0].sides.pos.B.strength = 0; } },
+    { "F(B) > 0",
+      [](X& x) { x.f.multiCurve = true; x.f.curves = {{0, x.f.sides}, {5, x.f.sides}};
+        x.f.curves[1].sides.pos.B.strength = 0; } },
+    { "Axial Force 5 already exists!",
+      [](X& x) { x.f.multiCurve = true; x.f.curves = {{5, x.f.sides}, {5, x.f.sides}}; } },
 };
 
 /// Spoils one number in each group; each later row keeps those of the groups after it spoiled.
-void (*const kGroups[])(F&) = {
-    [](F& f) { f.sides.pos.E.strength = -1; }, [](F& f) { f.sides.neg.E.strength = 1; },
-    [](F& f) { f.sides.pos.E.deform = 6; },    [](F& f) { f.sides.pos.IO = 5; },
-    [](F& f) { f.dcRatio = T_SIDES<double>{2, 2}; }, [](F& f) { f.sides.pos.yield = 0; },
-    [](F& f) { f.sides.pos.userStiffness = -1; },    [](F& f) { f.unloadExponent = -1; },
-    [](F& f) { f.energyBased = true; f.sides.pos.energy[0] = -1; },
+void (*const kGroups[])(X&) = {
+    [](X& x) { x.p.E.strength = -1; }, [](X& x) { x.n.E.strength = 1; },
+    [](X& x) { x.p.E.deform = 6; },    [](X& x) { x.p.IO = 5; },
+    [](X& x) { x.f.dcRatio = T_SIDES<double>{2, 2}; }, [](X& x) { x.p.yield = 0; },
+    [](X& x) { x.p.userStiffness = -1; },    [](X& x) { x.f.unloadExponent = -1; },
+    [](X& x) { x.f.energyBased = true; x.p.energy[0] = -1; },
 };
 const char* const kGroupRules[] = {
     "M(E) >= 0", "M(-E) <= 0", "D(D) <  D(E)", "IO <= LS",
@@ -115,19 +126,19 @@ const char* const kGroupRules[] = {
 TEST(HingeFemaCurve, ReportsEachRuleOutsideItsBoundAlone)
 {
     for (const T_CASE& c : kCases) {
-        F f = ValidBackbone<F>();
-        c.spoil(f);
-        EXPECT_EQ(c.rule, First(FindingsOf(f))) << "row " << &c - kCases;
+        X x;
+        c.spoil(x);
+        EXPECT_EQ(c.rule, First(FindingsOf(x.f))) << "row " << &c - kCases;
     }
 }
 
 TEST(HingeFemaCurve, ChecksTheGroupsInTheirOrder)
 {
     for (std::size_t from = 0; from < std::size(kGroups); ++from) {
-        F f = ValidBackbone<F>();
+        X x;
         for (std::size_t i = std::size(kGroups); i-- > from;)
-            kGroups[i](f);
-        EXPECT_EQ(kGroupRules[from], First(FindingsOf(f, 4)));
+            kGroups[i](x);
+        EXPECT_EQ(kGroupRules[from], First(FindingsOf(x.f, 4)));
     }
 }
 
