@@ -27,7 +27,7 @@ bool PrintYieldSide(const T_HINGE_ELEMENT& in, std::size_t c, SKEL_TYPE type, HI
     const T_THETA_LOOKUP lookup{&in.section, &in.material, in.memberLength};
     double deform = 0.0;
     if (yield)
-        deform = IsMoment(c) ? CHingeTheta::CalcThetaMoment(lookup, k, end, curve.initStiffness,
+        deform = IsMoment(k) ? CHingeTheta::CalcThetaMoment(lookup, k, end, curve.initStiffness,
                                                             side.userStiffness, *yield)
                              : CHingeTheta::CalcThetaShear(lookup, k, end, curve.initStiffness,
                                                            side.userStiffness, *yield);
