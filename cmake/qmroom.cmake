@@ -30,8 +30,8 @@ function(qm_room name)
                         PRIVATE $<BUILD_INTERFACE:qm_flags> ${ROOM_PRIVATE_DEPENDS})
 endfunction()
 
-# Heavy headers that target_precompile_headers() parses once for a target. The core rooms have none:
-# there a source that includes its own header first proves that the header stands alone.
+# Heavy headers, parsed once for a target. The core rooms have none: there a source that includes its
+# own header first proves that the header stands alone.
 set(QM_PCH_TEST <gtest/gtest.h> <algorithm> <filesystem> <fstream> <functional> <map> <memory> <optional>
                 <span> <string> <vector>)
 set(QM_PCH_JSON <nlohmann/json.hpp> <algorithm> <functional> <map> <memory> <optional> <string> <vector>)
@@ -39,3 +39,11 @@ set(QM_PCH_QT <QAbstractTableModel> <QApplication> <QBoxLayout> <QComboBox> <QDi
               <QGridLayout> <QLabel> <QLineEdit> <QMainWindow> <QPainter> <QPushButton> <QString>
               <QTableView> <QTimer> <QWidget> <algorithm> <functional> <map> <memory> <optional>
               <string> <vector>)
+
+# qm_precompile(<target> <header>...)
+function(qm_precompile target)
+  target_precompile_headers(${target} PRIVATE ${ARGN})
+  # With precompiled headers GCC 12 reports std::string concatenation as overflowing (GCC bug 105329).
+  target_compile_options(${target} PRIVATE
+    $<$<CXX_COMPILER_ID:GNU>:-Wno-stringop-overflow -Wno-array-bounds>)
+endfunction()
