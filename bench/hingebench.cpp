@@ -1,6 +1,6 @@
 // Checking a library of hinge types against parsing it.
 #include "qm_db/casefile.h"
-#include "qm_rps/po_hingetypedlg.h"
+#include "qm_rps/hinge/hingetypefindings.h"
 #include "ratios.h"
 
 #include <benchmark/benchmark.h>
@@ -61,7 +61,7 @@ void CheckHingeTypes(benchmark::State& state)
     for (auto _ : state) {
         std::size_t findings = 0;
         for (const auto& entry : content.model.hingeTypes)
-            findings += CPO_HingeTypeDlg::TypeFindings(entry.second, context).size();
+            findings += HingeTypeFindings(entry.second, context).size();
         if (findings != 0) state.SkipWithError("unexpected finding");
     }
 }

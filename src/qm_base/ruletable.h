@@ -1,9 +1,9 @@
 // Rules as rows of a table, and the walker that finds the rows that are not kept.
 //
 //     constexpr T_RULE<T_MASONRY> kRules[] = {
-//         {{.message = "IDS_MASONRY_HP", .field = "Hp"},
-//          [](const T_MASONRY& m) { return 0 < m.Hp; },
-//          [](const T_MASONRY& m) { return m.form == 1; }},
+//         {{.message = "IDS_QM_MASONRY_FORM", .field = "form"},
+//          [](const T_MASONRY& m) { return m.form == 1 || m.form == 2; },
+//          [](const T_MASONRY& m) { return m.active; }},
 //     };
 //     WalkRules(kRules, masonry, {}, findings);
 #pragma once

@@ -126,7 +126,7 @@ TEST(Outputs, ItalianTextsWithTheSameNumbers)
     } kRows[] = {
         {{"evaluate", ExampleCase("first-steps"), "--trace"},
          {"valutazione", "trovato", "domanda", "prova"}},
-        {{"info", ExampleCase("first-steps")}, {"nodi: ", "passi EC8"}},
+        {{"info", ExampleCase("first-steps")}, {"nodi: ", "valutazione PX EC8"}},
         {{"analyse", ExampleCase("tuned-beam")}, {"spostamenti", "reazioni (forze"}},
         {{"ulf", "solve", ExampleCase("tuned-beam"), "--item", "PROPS"}, {"condizione", "attiva"}},
         {{"ulf", "solve", ExampleCase("tuned-beam"), "--item", "X"}, {"nessuna voce"}},
