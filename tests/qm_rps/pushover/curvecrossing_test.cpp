@@ -3,7 +3,6 @@
 #include <algorithm>
 #include <cmath>
 #include <gtest/gtest.h>
-#include <numbers>
 #include <random>
 #include <vector>
 
@@ -96,17 +95,6 @@ T_CURVE RandomCapacity(CRandom& random, double first)
 
 } // namespace
 
-TEST(CurveCrossing, HalfLineIsFreeOfScale)
-{
-    for (const double scale : {1e-15, 1.0, 25.4, 1e12}) {
-        const T_CURVE c{{0.0, 2.0 * scale, 2.0 * scale}, {4.0, 4.0, 1.0}};
-        const auto p = CCurveCrossing::HalfLine({scale, 1.0}, c.View());
-        ASSERT_TRUE(p) << scale;
-        EXPECT_NEAR(2.0 * scale, p->x, 1e-12 * scale);
-        EXPECT_NEAR(2.0, p->y, 1e-12);
-    }
-}
-
 TEST(CurveCrossing, HalfLineTakesTheFirstSegmentInWalkOrderPastTheOrigin)
 {
     const T_CURVE fromOrigin{{0.0, 1.0, 2.0, 0.0}, {0.0, 2.0, 1.0, 4.0}};
@@ -114,16 +102,6 @@ TEST(CurveCrossing, HalfLineTakesTheFirstSegmentInWalkOrderPastTheOrigin)
     const T_CURVE along{{0.0, 1.0, 2.0, 3.0}, {0.0, 1.0, 2.0, 2.5}};
     // The segments along the line don't cross it; the one that leaves it touches it.
     ExpectPoint(2.0, 2.0, CCurveCrossing::HalfLine({1.0, 1.0}, along.View()));
-}
-
-TEST(CurveCrossing, PeriodLineHasTheSlopeOfItsPeriod)
-{
-    const double g = 4.0 * std::numbers::pi * std::numbers::pi; // slope 1 / T2
-    const T_CURVE level{{0.0, 10.0}, {2.0, 2.0}}, constantSd{{4.0, 4.0}, {2.0, 0.5}};
-    ExpectPoint(8.0, 2.0, CCurveCrossing::PeriodLine(2.0, g, level.View()));
-    ExpectPoint(4.0, 1.0, CCurveCrossing::PeriodLine(2.0, g, constantSd.View()));
-    for (const double T : {0.0, std::nan("")})
-        EXPECT_FALSE(CCurveCrossing::PeriodLine(T, g, level.View()));
 }
 
 TEST(CurveCrossing, TouchesWithinABillionthOfTheSegmentCount)

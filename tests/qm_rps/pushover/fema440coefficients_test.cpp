@@ -1,5 +1,5 @@
-#include "perfptfixture.h"
 #include "qm_rps/pushover/fema440coefficients.h"
+
 #include "qm_rps/pushover/fema440workingspectrum.h"
 
 #include <cmath>
@@ -104,31 +104,4 @@ TEST(Fema440Coefficients, ReductionAndMadrsFactors)
     double M = 0.0;
     EXPECT_EQ(1, CalcFema440M(3.0, 2.0, 0.1, 4.0, M)); // 2.25 * 1.3 / 4
     EXPECT_NEAR(0.73125, M, 1e-15);
-}
-
-TEST(Fema440WorkingSpectrum, ReducesFromTheOwnersCopyAndModifiesAccelerationsOnly)
-{
-    CTestRecord record(Bilinear(1.0, 1.0, 0.0, 9.0),
-                       T_SPFC_USER{{0.0, 1.0, 2.0}, {3.0, 3.0, 1.0}, {}}, {},
-                       kGravityUnit); // Sd = T2 Sa
-    CFema440WorkingSpectrum working(record);
-    ASSERT_EQ(1, working.ReduceByB(5.0));
-    ASSERT_EQ(1, working.ReduceByB(2.0)); // not on top of the first
-    const T_ADRS_CURVE reduced = Polyline({{0.0, 1.5}, {1.5, 1.5}, {2.0, 0.5}});
-    for (std::size_t i = 0; i < 3; ++i) {
-        EXPECT_NEAR(reduced.Sd[i], working.Curve().Sd[i], 1e-12) << i;
-        EXPECT_NEAR(reduced.Sa[i], working.Curve().Sa[i], 1e-12) << i;
-    }
-    const std::vector<double> Sd = working.Curve().Sd;
-    working.Modify(0.5);
-    EXPECT_EQ(Sd, working.Curve().Sd);
-    EXPECT_NEAR(0.75, working.Curve().Sa[1], 1e-12);
-    EXPECT_EQ(0, working.ReduceByB(0.0));
-    EXPECT_NEAR(0.75, working.Curve().Sa[1], 1e-12) << "as it was";
-    double Ds = 0.0, As = 0.0;
-    EXPECT_EQ(1, working.OnRadialLine(1.0, 1.0, Ds, As)); // of (0, .75), (1.5, .75), (2, .25)
-    EXPECT_NEAR(0.75, Ds, 1e-12);
-    EXPECT_EQ(0, working.OnRadialLine(1.0, 0.1, Ds, As)) << "beyond the last period";
-    working.Restore();
-    EXPECT_EQ(record.Demand(), working.Curve());
 }

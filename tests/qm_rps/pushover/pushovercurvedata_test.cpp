@@ -72,8 +72,7 @@ TEST(CurveData, FactorsByModeAndByMass)
         CPushOverCurveData curve(doc);
         ASSERT_EQ(1, curve.Calc(Settings(k.type, k.eigen))) << k.label << curve.Error();
         const T_PUSH_FACTORS& f = curve.Factors();
-        EXPECT_DOUBLE_EQ(k.gamma, f.gamma) << k.label;
-        EXPECT_DOUBLE_EQ(k.alpha, f.alpha) << k.label;
+        ExpectNear({k.gamma, k.alpha}, {f.gamma, f.alpha}, k.label);
         EXPECT_DOUBLE_EQ(5.0, f.mass) << k.label; // not the restrained 7, not the unlisted 50
         EXPECT_DOUBLE_EQ(50.0, f.weight) << k.label;
         EXPECT_EQ(k.mode, f.mode) << k.label;

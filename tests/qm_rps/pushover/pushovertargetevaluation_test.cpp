@@ -1,10 +1,9 @@
+// By hand; examples/verification holds the published N2 cases.
 #include "qm_rps/pushover/pushovertargetevaluation.h"
 
 #include <cmath>
-#include <fstream>
 #include <gtest/gtest.h>
 #include <numbers>
-#include <sstream>
 
 namespace {
 
@@ -200,94 +199,4 @@ TEST(TargetEvaluation, Ntc2018TakesTheSmallerOfRiseAndYield)
     const double dy = 0.1 - std::sqrt(0.01 - 0.00235);
     EXPECT_NEAR(dy, e.Rows()[1].capacity.value(), 1e-15);
     EXPECT_EQ("OK", e.Rows()[1].remark); // demand 1.5 * 0.0025
-}
-
-// Published: EN 1998-1 Annex B with dm* = dt*, 3-storey shear building (engineering-calculator
-// notes, "algoritmos.md" sections 10 to 12), g = 9.81; recomputed there to eight digits. The
-// capacity follows from the storey shears of the first yield and is given there in mm to three
-// decimals, hence 2e-5. No difference beyond that.
-TEST(TargetEvaluation, PublishedShortPeriodBuildingWithIteration)
-{
-    constexpr double kGammaPub = 1.26190454, kMass = 198.983683;    // kN s2/m
-    const double roof[] = {0.0045823, 0.045823, 0.08242, 0.493903}; // m
-    const double shear[] = {150.0, 1500.0, 1636.529, 2487.296};     // kN
-    T_TARGET_INPUT in;
-    for (std::size_t i = 0; i < 4; ++i) {
-        in.capacity.Sd.push_back(roof[i] / kGammaPub);
-        in.capacity.Sa.push_back(shear[i] / (kGammaPub * kMass * 9.81));
-    }
-    in.gravity = 9.81;
-    in.gamma = kGammaPub;
-    in.mStar = kMass;
-    in.options.iterate = true;
-    in.spectra[0] = Constant(0.3 * 1.15 * 2.5, 0.6); // type 1, ground C, plateau
-    CPushOverTargetEvaluation e(in);
-    ASSERT_EQ(1, e.UpdateTargetDispDataEC8());
-    const T_TARGET_DISP& t = e.Targets().at(0);
-    EXPECT_NEAR(1260.2738, t.Fy, 2e-5 * 1260);
-    EXPECT_NEAR(0.039465776, t.dy, 2e-5 * 0.039);
-    EXPECT_NEAR(0.49598264, t.Tstar, 2e-5 * 0.5);
-    EXPECT_NEAR(1.33592067, t.qu.value(), 2e-5 * 1.3);
-    EXPECT_NEAR(0.055503479, t.dt, 2e-5 * 0.055);
-    EXPECT_NEAR(0.070040092, e.Rows()[1].demand.value(), 2e-5 * 0.07);
-    EXPECT_GT(t.iterations, 1);
-
-    // The fixed point itself by bisection, with the two trapezoids written out.
-    const auto residual = [&](double dm) {
-        const auto& [d, a] = in.capacity;
-        const double am = a[1] + (a[2] - a[1]) * (dm - d[1]) / (d[2] - d[1]);
-        const double area = a[1] * d[1] / 2 + (a[1] + am) / 2 * (dm - d[1]);
-        const double dy = 2 * (dm - area / am);
-        const double T = 2 * kPi * std::sqrt(dy / (am * 9.81));
-        return dy * (1 + (0.8625 / am - 1) * 0.6 / T) - dm;
-    };
-    double low = in.capacity.Sd[1], high = in.capacity.Sd[2];
-    for (int i = 0; i < 100; ++i)
-        (residual((low + high) / 2) > 0 ? low : high) = (low + high) / 2;
-    EXPECT_NEAR(low, t.dt, 1e-6 * low); // the iteration stops at a change of 1e-6
-}
-
-// Published: N2 with equal displacements on a capacity curve of 299 points
-// (panagop/streng_jupyters, "N2 method.ipynb"). Its stiffness is the secant at 0.6 of the yield
-// force that it arrives at; the ntc rule takes 0.6 of the peak force. With the source's own level
-// (0.6 * 2.90601 of the peak 3.05065 m/s2) its figures come back; with the rule's 0.6 the target is
-// 0.6 % larger, as a separate calculation of the rule gives it.
-TEST(TargetEvaluation, PublishedLongPeriodCurve)
-{
-    std::ifstream file(std::string(QM_RPS_GOLDEN) + "/n2_roof_curve.txt");
-    // Three masses of 39.08 t, shape 0.0483, 0.092, 0.1217.
-    const double L = 0.0483 + 0.092 + 0.1217;
-    const double M = 0.0483 * 0.0483 + 0.092 * 0.092 + 0.1217 * 0.1217;
-    const double gamma = L / M * 0.1217, mass = 39.08 * L * L / M; // m, kN s2/m
-    T_TARGET_INPUT in;
-    for (std::string line; std::getline(file, line);) {
-        double roof = 0.0, shear = 0.0;
-        if (line.starts_with('#') || !(std::istringstream(line) >> roof >> shear) || roof == 0.0)
-            continue;
-        in.capacity.Sd.push_back(roof / gamma);
-        in.capacity.Sa.push_back(shear / (mass * 9.81));
-    }
-    ASSERT_EQ(298U, in.capacity.Sd.size()); // the origin is not a step
-    in.gravity = 9.81;
-    in.gamma = gamma;
-    in.options = BilinearDefaults(BILINEAR_RULE::Ntc);
-    const double plateau = 2.3544 / 9.81 * 1.15 * 2.5; // type 1, ground C, TC = 0.6, TD = 2
-    in.spectra[0] = {[=](double T) { return plateau * 0.6 / T; }, 0.6};
-    struct T_ROW {
-        double secant, ay, dy, T, dt, tol; // half of the last digit
-    };
-    const T_ROW rows[] = {
-        {0.6 * 2.90601064 / 3.0506545082, 2.90601064, 0.04411372, 0.77413755, 0.07963936, 5e-9},
-        {0.6, 2.908140360, 0.0446695672, 0.778714137, 0.0801101732, 1e-9}};
-    for (const T_ROW& r : rows) {
-        in.options.secant = r.secant;
-        CPushOverTargetEvaluation e(in);
-        ASSERT_EQ(1, e.UpdateTargetDispDataEC8());
-        const T_TARGET_DISP& t = e.Targets().at(0);
-        EXPECT_NEAR(r.ay, t.ay * 9.81, r.tol);
-        EXPECT_NEAR(r.dy, t.dy, r.tol);
-        EXPECT_NEAR(r.T, t.Tstar, r.tol);
-        EXPECT_NEAR(r.dt, t.dt, r.tol);
-        EXPECT_FALSE(t.qu);
-    }
 }
