@@ -1,7 +1,10 @@
 // Builds the record that a performance-point calculator works on, and runs a calculator on it.
 #pragma once
 
-#include "qm_rps/pushovercalcperfptbase.h"
+#include "qm_rps/pushovercalcperfptfema440proca.h"
+#include "qm_rps/pushovercalcperfptfema440procc.h"
+#include "qm_rps/pushovercalcperfptproca.h"
+#include "qm_rps/pushovercalcperfptprocb.h"
 
 #include <numbers>
 #include <utility>
@@ -75,6 +78,20 @@ T_RUN RunPerfPt(CPushOverPerfPtRecord& record, ARGS... args)
     r.outcome = calc.Outcome();
     r.trace = calc.Trace();
     return r;
+}
+
+/// ATC-40 procedures 'A' and 'B', FEMA 440 procedures 'a', 'b' (MADRS crossing) and 'c' (locus).
+inline T_RUN RunProcedure(CPushOverPerfPtRecord& record, char procedure)
+{
+    if (procedure == 'A') return RunPerfPt<CPushOverCalcPerfPtProcA>(record);
+    if (procedure == 'B') return RunPerfPt<CPushOverCalcPerfPtProcB>(record);
+    if (procedure == 'c') return RunPerfPt<CPushOverCalcPerfPtFEMA440ProcC>(record);
+    return RunPerfPt<CPushOverCalcPerfPtFEMA440ProcA>(record, procedure - 'a');
+}
+
+inline T_SPFC_ATC40 Atc40(double Ca)
+{
+    return {Ca, Ca, {}};
 }
 
 /// The curve of the ATC-40 (1996) 8.3.3.3 example, its printed points in mm and m/s2.
