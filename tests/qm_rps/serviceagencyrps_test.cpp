@@ -1,16 +1,12 @@
 #include "qm_rps/serviceagencyrps.h"
 
 #include "frametest.h"
+#include "hingesample.h"
 #include "numbers.h"
 #include "qm_base/appbase.h"
-#include "qm_rps/po_femastrlossfigure0dlg.h"
-#include "qm_rps/po_femastrlossfigureedlg.h"
-#include "qm_rps/po_femaunloadstifffigureedlg.h"
 #include "qm_rps/po_hingeskcvtabfemaaxialdlg.h"
 #include "qm_rps/po_hingeskcvtabfemadlg.h"
 #include "qm_rps/rps_main.h"
-
-#include <random>
 
 namespace {
 
@@ -26,78 +22,11 @@ protected:
     CServiceAgencyRps m_agency;
 };
 
-/// Random records: every field of a curve has a value of its own.
-class CRandomHinge {
-public:
-    T_SKEL_FEMA Curve()
-    {
-        T_SKEL_FEMA c;
-        c.symmetric = Flag();
-        c.autoYield = Flag();
-        c.measure = static_cast<SKEL_MEASURE>(Int(1));
-        c.sides = {Side(), Side()};
-        c.strengthLoss = Flag();
-        c.initStiffness = static_cast<INIT_STIFFNESS>(Int(4));
-        c.asymStiffness = Flag();
-        c.unloadType = static_cast<UNLOAD_TYPE>(Int(4));
-        c.unloadFactor = Real();
-        c.unloadExponent = Real();
-        c.unloadProportion = Real();
-        c.energyBased = Flag();
-        c.multiCurve = Flag();
-        for (int i = Int(3); i > 0; --i)
-            c.curves.push_back({Real(), {Side(), Side()}});
-        if (Flag()) c.dcRatio = T_SIDES<double>{Real(), Real()};
-        c.infillStrut = Flag();
-        c.infillGeneral = Flag();
-        c.compliance = Flag();
-        return c;
-    }
-    T_IEHP_D Record()
-    {
-        T_IEHP_D r;
-        r.name = "hinge " + std::to_string(Int(1000));
-        for (auto& c : r.components)
-            if (Int(3) > 0) c = Curve();
-        return r;
-    }
-    bool Flag() { return Int(1) == 1; }
-    int Int(int most) { return std::uniform_int_distribution<int>(0, most)(m_engine); }
-    double Real() { return std::normal_distribution<double>(0.0, 1e3)(m_engine); }
-
-private:
-    T_SKEL_SIDE Side()
-    {
-        T_SKEL_SIDE s;
-        s.yield = Real();
-        s.yieldDeform = Real();
-        for (T_SKEL_POINT* p : {&s.B, &s.C, &s.D, &s.E})
-            *p = {Real(), Real()};
-        s.IO = Real();
-        s.LS = Real();
-        s.CP = Real();
-        s.userStiffness = Real();
-        for (double& e : s.energy)
-            e = Real();
-        return s;
-    }
-    std::mt19937 m_engine{7};
-};
-
-/// A curve that keeps every rule, of a moment component.
+/// A curve that keeps every rule.
 T_SKEL_FEMA GoodCurve()
 {
-    T_SKEL_FEMA c;
-    T_SKEL_SIDE& s = c.sides.pos;
-    s.yield = 100.0;
-    s.yieldDeform = 0.01;
-    s.B = {1.0, 1.0};
-    s.C = {6.0, 1.1};
-    s.D = {7.0, 0.4};
-    s.E = {9.0, 0.3};
-    s.IO = 2.0;
-    s.LS = 4.0;
-    s.CP = 6.0;
+    T_SKEL_FEMA c = ValidBackbone<T_SKEL_FEMA>();
+    c.symmetric = true;
     return c;
 }
 
@@ -113,26 +42,6 @@ std::vector<T_SKEL_AXIAL> Rows(std::initializer_list<double> forces)
 
 } // namespace
 
-TEST_F(Service, ConversionsLoseNothingEitherWayForEveryComponent)
-{
-    CRandomHinge random;
-    for (int round = 0; round < 200; ++round)
-        for (int c = 0; c < 6; ++c) {
-            const T_IEHP_D iehp = random.Record();
-            T_PHGT_D type;
-            ASSERT_EQ(1, CAttrCtrl::Convert_IehpToPhgt_FEMA(iehp, c, type));
-            T_IEHP_D back = iehp, fresh;
-            back.name = "other";
-            back.components[static_cast<std::size_t>(c)] = random.Curve(); // to be overwritten
-            ASSERT_EQ(1, CAttrCtrl::Convert_PhgtToIehp_FEMA(type, c, back));
-            EXPECT_EQ(iehp, back) << c; // the component, and the others as they were
-            ASSERT_EQ(1, CAttrCtrl::Convert_PhgtToIehp_FEMA(type, c, fresh));
-            T_PHGT_D again;
-            ASSERT_EQ(1, CAttrCtrl::Convert_IehpToPhgt_FEMA(fresh, c, again));
-            EXPECT_EQ(type, again) << c;
-        }
-}
-
 TEST_F(Service, TheEditorChangesTheCallersComponentOnOkAlone)
 {
     T_IEHP_D record;
@@ -144,9 +53,6 @@ TEST_F(Service, TheEditorChangesTheCallersComponentOnOkAlone)
     T_SERVICE_REQUEST request{.kind = 1, .index = 4, .record = &record};
     m_view.m_run = [&](zql::frx::MDialog& dialog) {
         auto& fema = dynamic_cast<CPO_HingeSkcvTabFemaDlg&>(dialog);
-        EXPECT_TRUE(fema.IsTimeHistory());
-        for (int c = 0; c < 6; ++c) // components 3 and 4, as they are numbered
-            EXPECT_EQ(c == 3 || c == 4, fema.IsMomentRotationEnabled(HINGE_COMPONENT(c))) << c;
         fema.Curve(HINGE_COMPONENT::My, HINGE_END::Both)->sides.pos.yield = 120.0;
         request.index = 0; // the record was copied
         return answer;
@@ -204,13 +110,11 @@ TEST_F(Service, AxialForcesAreRebuiltFromTheEditedTableFirst)
         return 1;
     };
     EXPECT_EQ(1, Ask({.kind = 2, .rows = &rows}));
-    ASSERT_EQ(4U, rows.size());
-    const std::vector<std::pair<double, double>> expected{
-        {100.0, 100.0}, {250.0, 77.0}, {450.0, 600.0}, {500.0, 600.0}};
-    for (std::size_t i = 0; i < expected.size(); ++i) {
-        EXPECT_EQ(expected[i].first, rows[i].axial);
-        EXPECT_EQ(expected[i].second, rows[i].sides.pos.yield);
-    }
+    std::vector<std::pair<double, double>> found;
+    for (const T_SKEL_AXIAL& row : rows)
+        found.emplace_back(row.axial, row.sides.pos.yield);
+    const decltype(found) expected{{100, 100}, {250, 77}, {450, 600}, {500, 600}};
+    EXPECT_EQ(expected, found);
     const auto before = rows;
     m_view.m_run = [](zql::frx::MDialog& dialog) {
         return 1 - dynamic_cast<CPO_HingeSkcvTabFemaAxialDlg&>(dialog).RemoveForce(100.0);
@@ -254,30 +158,16 @@ TEST_F(Service, TheAxialTableHoldsTenForcesAndRefusesBadOnes)
     EXPECT_EQ(0, d.AddForce(4.0)); // is there
     EXPECT_EQ(1, d.AddForce(3.0));
     EXPECT_EQ(10U, d.Keys().size());
-    const std::vector<std::string> keys{"IDS_RPS_PUSHOVER_Maxnum_reached",
-                                        "IDS_QM_UI_AXIAL_ROWS",
-                                        "IDS_QM_UI_AXIAL_ROWS",
-                                        "IDS_RPS_PUSHOVER_Maxnum_reached",
+    const char* const full = "IDS_RPS_PUSHOVER_Maxnum_reached";
+    const char* const rows = "IDS_QM_UI_AXIAL_ROWS";
+    const std::vector<std::string> keys{full,
+                                        rows,
+                                        rows,
+                                        full,
                                         "IDS_QM_UI_AXIAL_YIELD",
                                         "Axial Force %g does not exist!",
                                         "Axial Force %g already exists!"};
     EXPECT_EQ(keys, m_view.m_messages);
-}
-
-TEST_F(Service, FiguresAreShownAndGiveZero)
-{
-    std::vector<std::string> shown;
-    m_view.m_run = [&](zql::frx::MDialog& dialog) {
-        shown.push_back(dynamic_cast<CFemaFigureDlg&>(dialog).TitleKey());
-        return 1;
-    };
-    for (const int kind : {3, 4, 5})
-        EXPECT_EQ(0, Ask({.kind = kind}));
-    EXPECT_EQ((std::vector<std::string>{CPO_FEMAStrLossFigure0Dlg().TitleKey(),
-                                        CPO_FEMAStrLossFigureEDlg().TitleKey(),
-                                        CPO_FEMAUnloadStiffFigureEDlg().TitleKey()}),
-              shown);
-    EXPECT_EQ(0U, Raised());
 }
 
 TEST_F(Service, IsReachedAtTheHeadOfficeUnderItsName)
@@ -288,8 +178,10 @@ TEST_F(Service, IsReachedAtTheHeadOfficeUnderItsName)
     EXPECT_EQ(1, RegisterRPSService()); // the same one
     EXPECT_EQ(agency, CServiceHeadOffice::Instance()->GetAgency("rps"));
     EXPECT_EQ(nullptr, CServiceHeadOffice::Instance()->GetAgency("\"rps\""));
-    EXPECT_EQ(0, agency->Service({.kind = 4}));
-    EXPECT_EQ(1, m_view.m_shown);
+    for (const int kind : {3, 4, 5}) // the figures
+        EXPECT_EQ(0, agency->Service({.kind = kind}));
+    EXPECT_EQ(3, m_view.m_shown);
+    EXPECT_EQ(0U, Raised());
 }
 
 TEST_F(Service, WithoutADocumentNothingIsShown)
