@@ -2,7 +2,6 @@
 
 #include "qm_base/debugout.h"
 
-#include <atomic>
 #include <deque>
 #include <mutex>
 
@@ -11,7 +10,6 @@ namespace {
 constexpr std::size_t kKeptAssertions = 1000;
 
 struct T_ASSERTION_LIST {
-    std::atomic<bool> enabled = true;
     std::mutex guard;
     std::deque<T_ASSERTION> kept;
 };
@@ -24,19 +22,8 @@ T_ASSERTION_LIST& List()
 
 } // namespace
 
-bool CAppBase::IsReleaseAssert_ST()
-{
-    return List().enabled;
-}
-
-void CAppBase::EnableReleaseAssert_ST(bool enabled)
-{
-    List().enabled = enabled;
-}
-
 void CAppBase::ReleaseAssertion_ST(const char* source, int line)
 {
-    if (!IsReleaseAssert_ST()) return;
     if (!source) source = "";
     GDebugOut("release assertion: %s(%d)", source, line);
 

@@ -12,9 +12,8 @@ struct T_ASSERTION {
 
 class CAppBase {
 public:
-    /// True while release assertions are reported (the default).
-    static bool IsReleaseAssert_ST();
-    static void EnableReleaseAssert_ST(bool enabled);
+    /// Are release assertions reported? Here always; callers ask before they raise one.
+    static bool IsReleaseAssert_ST() { return true; }
 
     /// Logs source and line through GDebugOut, keeps the latest 1,000 for inspection, and returns.
     static void ReleaseAssertion_ST(const char* source, int line);

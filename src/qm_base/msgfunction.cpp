@@ -5,6 +5,7 @@
 #include "qm_base/messagetext.h"
 
 #include <atomic>
+#include <vector>
 
 namespace zql::lib {
 
@@ -64,24 +65,6 @@ int MMSGFunction::SetLanguage(std::string_view code)
 std::string MMSGFunction::GetLanguage()
 {
     return std::string(MessageSources()[Chosen()].language);
-}
-
-std::vector<std::string> MMSGFunction::Languages()
-{
-    std::vector<std::string> languages;
-    for (const T_MESSAGE_SOURCE& source : MessageSources())
-        languages.emplace_back(source.language);
-    return languages;
-}
-
-std::vector<std::string> MMSGFunction::Keys(std::string_view language)
-{
-    std::vector<std::string> keys;
-    const std::size_t i = IndexOf(language);
-    if (i == MessageSources().size()) return keys;
-    for (const auto& [key, text] : Catalogues()[i].All())
-        keys.push_back(key);
-    return keys;
 }
 
 std::string MMSGFunction::GetValueOf(std::string_view language, std::string_view key)

@@ -4,7 +4,6 @@
 #include <initializer_list>
 #include <string>
 #include <string_view>
-#include <vector>
 
 namespace zql::lib {
 
@@ -20,9 +19,6 @@ public:
     /// "en" or "it". 1 done; 0 unknown language, nothing changed.
     [[nodiscard]] static int SetLanguage(std::string_view code);
     static std::string GetLanguage();
-    static std::vector<std::string> Languages();
-    /// Every key of one language's catalogue, sorted.
-    static std::vector<std::string> Keys(std::string_view language);
     /// Text of one language only (no fall-back); empty when that catalogue lacks the key.
     static std::string GetValueOf(std::string_view language, std::string_view key);
 

@@ -11,10 +11,8 @@ public:
     /// untitled: the file that copies of a document without a path go beside; empty: none are made.
     explicit CMainFrame(CDBDoc& doc, const std::string& untitled = {});
 
-    CDBDoc& Doc() { return m_doc; }
     /// "frame.qmdb", with a star while there are unsaved edits and a note where it is read only.
     std::string Title() const;
-    bool IsReadOnly() const { return m_readOnly; }
     /// Of a file that a save without a name goes to; empty: none yet, or it may not be written.
     std::string SavePath() const;
 

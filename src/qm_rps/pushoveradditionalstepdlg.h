@@ -11,7 +11,6 @@ class CPushOverAdditionalStepDlg : public zql::frx::MDialog {
 public:
     /// Steps that exist: 1 to stepCount.
     void SetStepCount(int stepCount) { m_stepCount = stepCount; }
-    const std::vector<int>& Steps() const { return m_steps; }
 
     /// 1 added; 0 the list is full (IDS_RPS_PUSHOVER_Maxnum_reached), the step does not exist
     /// (IDS_QM_NO_SUCH_STEP) or is listed already (IDS_PUSHOVER_Error___The_data_already_exist_).

@@ -79,8 +79,6 @@ public:
 
     const std::vector<T_PERFPT_TRIAL>& Trace() const { return m_trace; }
     const T_OUTCOME& Outcome() const { return m_outcome; }
-    /// Trials made.
-    int Trials() const { return static_cast<int>(m_trace.size()); }
 
 protected:
     /// FEMA 440 effective period (s) and damping (per cent) for a ductility range 0 to 2; another

@@ -35,7 +35,6 @@ public:
     [[nodiscard]] int Create(const WINDOW_MAKER& maker, int id, zql::frx::IDialogView* parent);
     void ShowWindow();
     void RefreshWindow();
-    bool HasWindow() const { return m_window != nullptr; }
     /// Before the dialog goes: its window reads it to the last.
     void DestroyWindow() { m_window.reset(); }
 

@@ -266,13 +266,3 @@ int WritePushoverText(const std::string& text, const std::string& path, std::str
         MMSGFunction::Format("IDS_RPS_PUSHOVER_Can_t_create_the_file__", {path}) + " " + fault.text;
     return 0;
 }
-
-int WritePushoverReport(const T_PUSH_EVALUATION& e, const std::string& path, std::string& error)
-{
-    return WritePushoverText(PushoverReportText(e), path, error);
-}
-
-int WritePushoverCurve(const T_PUSH_EVALUATION& e, const std::string& path, std::string& error)
-{
-    return WritePushoverText(PushoverCurveText(e), path, error);
-}

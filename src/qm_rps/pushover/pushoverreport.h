@@ -18,11 +18,6 @@ std::string PushoverCurveText(const T_PUSH_EVALUATION& e);
 std::string PlotXLabel(PLOT_TYPE type);
 std::string PlotYLabel(PLOT_TYPE type);
 
-/// Writes a text, the report, or the curve table alone. 1 done; 0 the file can't be created (error
-/// filled, nothing written).
+/// Writes one of these texts. 1 done; 0 the file can't be created (error filled, nothing written).
 [[nodiscard]] int WritePushoverText(const std::string& text, const std::string& path,
                                     std::string& error);
-[[nodiscard]] int WritePushoverReport(const T_PUSH_EVALUATION& e, const std::string& path,
-                                      std::string& error);
-[[nodiscard]] int WritePushoverCurve(const T_PUSH_EVALUATION& e, const std::string& path,
-                                     std::string& error);
