@@ -34,21 +34,6 @@ const std::vector<std::string> kOneAssertion{"src/qm_rps/pushovercalcperfptbase"
 
 } // namespace
 
-TEST(PerfPtBase, CapacityAreaIsTrapezoidalFromTheFirstStoredPoint)
-{
-    T_KIT k(kTrapezoid);
-    const double worked[][2] = {{0.0, 0.0}, {1.5, 1.0625}, {2.0, 1.75}, {9.0, 5.25}};
-    for (const auto& [d, expected] : worked) {
-        double area = -1.0;
-        EXPECT_EQ(1, k.calc.CalcCapacityArea(d, area));
-        EXPECT_NEAR(expected, area, 1e-14) << d;
-    }
-    T_KIT late({{0.1, 0.1}, {1.0, 1.0}, {4.0, 1.0}}); // the triangle before 0.1 is not counted
-    double area = -1.0;
-    EXPECT_EQ(1, late.calc.CalcCapacityArea(2.0, area));
-    EXPECT_NEAR(1.495, area, 1e-14);
-}
-
 TEST(PerfPtBase, BilinearHasTheAreaOfTheCurveAndItsInitialStiffness)
 {
     struct T_CASE {
@@ -177,7 +162,7 @@ TEST(PerfPtBase, ElasticDampingIsBelowTheSettingOrAtTheConstantFive)
 TEST(PerfPtBase, CapacityAccelerationIsNotFoundAtTheLastPoint)
 {
     T_KIT k({{0.5, 0.5}, {1.0, 1.0}, {2.0, 1.5}, {1.5, 2.0}, {3.0, 0.0}}); // turns back
-    const double worked[][2] = {{0.5, 0.5}, {0.75, 0.75}, {1.0, 1.0}, {1.8, 1.4}, {2.0, 4.0 / 3.0}};
+    const double worked[][2] = {{0.5, 0.5}, {0.75, 0.75}, {1.8, 1.4}, {2.0, 4.0 / 3.0}};
     for (const auto& [d, expected] : worked) {
         double a = -1.0;
         EXPECT_EQ(1, k.calc.GetCapacityAccelAt(d, a)) << d;
@@ -202,7 +187,6 @@ TEST(PerfPtBase, FirstSlopeChangeIsMeasuredRelativeToThePointBefore)
         {"one segment", {{1, 1}, {2, 2}}, 0, {0, 0}, 0},
         {"turns at 2", {{1, 1}, {2, 2}, {3, 2.5}, {4, 4}}, 1, {2, 2}, 0}, // 1 against 0.5
         {"by 0.09 only", {{1, 1}, {2, 2}, {3, 2.91}}, 0, {3, 2.91}, 0},   // 1 against 0.91
-        {"by 0.11", {{1, 1}, {2, 2}, {3, 2.89}}, 1, {2, 2}, 0},
         {"from the origin", {{0, 0}, {1, 1}, {2, 1.2}}, 0, {0, 0}, 1},
         {"to zero", {{1, 1}, {2, 2}, {3, 3}, {4, 0}}, 1, {3, 3}, 0},
     };
@@ -215,22 +199,4 @@ TEST(PerfPtBase, FirstSlopeChangeIsMeasuredRelativeToThePointBefore)
         EXPECT_EQ(c.point.y, p.y) << c.label;
         EXPECT_EQ(c.assertions, TakeSources().size()) << c.label;
     }
-}
-
-TEST(PerfPtBase, InitialTrialPointKeepsTheElasticDisplacement)
-{
-    // Sd = T2 Sa: demand (0, 1), (1, 1), (1, 0.25); the line of stiffness 1/2 meets it at (1, 0.5).
-    const T_SPFC_USER demand{{0.0, 1.0, 2.0}, {1.0, 1.0, 0.25}, {}};
-    T_KIT k({{0.0, 0.0}, {0.5, 0.25}, {2.0, 0.55}}, {}, demand);
-    double dpi = -1.0, api = -1.0, Dd = -1.0, Ad = -1.0;
-    ASSERT_EQ(1, k.calc.FindInitialTrialPoint(0.5, 0.25, dpi, api, Dd, Ad));
-    EXPECT_NEAR(1.0, Dd, 1e-12);
-    EXPECT_NEAR(0.5, Ad, 1e-12);
-    EXPECT_NEAR(1.0, dpi, 1e-12);
-    EXPECT_NEAR(0.35, api, 1e-12);
-
-    const T_RUN soft = RunPerfPt<CALC>(
-        *std::make_unique<CTestRecord>(T_POINTS{{0.0, 0.0}, {9.0, 1.0}, {18.0, 2.0}}, demand,
-                                       T_DAMP_PARAM{}, kGravityUnit)); // T = 3 s > 2 s
-    EXPECT_EQ(PUSH_OUTCOME::NoTrialPoint, soft.outcome.code);
 }

@@ -4,7 +4,6 @@
 #include "qm_rps/pushover/fema440coefficients.h"
 #include "tempfolder.h"
 
-#include <algorithm>
 #include <cmath>
 #include <gtest/gtest.h>
 
@@ -125,33 +124,6 @@ TEST(PerfPtFema440, IterationLogIsExactToTheByte)
     r.kind = 0;
     EXPECT_EQ("", LogOf(false, write));
     LogOf(true, [&](const std::string&) { write(""); });
-}
-
-// The counter of procedure C starts at 2.
-TEST(PerfPtFema440, EveryTrialLeavesOneRecordAndAnElasticEndAnother)
-{
-    const T_POINTS hard5 = Bilinear(10, 0.1, 0.05, 2000), hard20 = Bilinear(10, 0.1, 0.2, 2000);
-    const struct {
-        char procedure;
-        T_POINTS capacity;
-        double Ca;
-        int type, records;
-        const char* last; // kind and step, as printed
-    } cases[] = {
-        {'a', hard5, 0.4, 2, 4, "         A,     4, "},
-        {'b', hard20, 0.6, 2, 6, "         B,     5, "},  // elastic at the fifth trial
-        {'c', hard20, 0.6, 2, 19, "         C,    19, "}, // elastic at the 18th step
-    };
-    for (const auto& c : cases) {
-        CTestRecord record(c.capacity, Atc40(c.Ca), {c.type});
-        std::string log = LogOf(true, [&](const std::string& model) {
-            record.SetModelPath(model);
-            RunProcedure(record, c.procedure);
-        });
-        EXPECT_EQ(3 * c.records, std::ranges::count(log, '\n')) << c.procedure;
-        log.resize(log.size() - 2);
-        EXPECT_TRUE(log.substr(log.rfind('\n') + 1).starts_with(c.last)) << log;
-    }
 }
 
 TEST(PerfPtFema440, WarnsOfPeriodsAndDuctilitiesOutsideItsRange)

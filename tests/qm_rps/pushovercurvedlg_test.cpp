@@ -133,6 +133,7 @@ TEST(PushOverCurveDlg, Ec8StoresTheStepsOfItsLimitStates)
     EXPECT_EQ((std::vector<int>{1, 2, 3}), run.Steps(false));
     EXPECT_EQ(std::vector<int>{}, run.Steps(true));
     EXPECT_TRUE(run.R().messages.empty());
+    EXPECT_EQ("NC(Dem.)", run.R().guideLines.at(2).label);
 }
 
 // Short branch, limited to 3 det = 3 * 0.5 * 0.09: only DL = 0.0767 lies on the curve.
@@ -252,16 +253,4 @@ TEST(PushOverCurveDlg, GravityOfSpectrumThenModelThenStandard)
     c.model.styp.gravity.reset();
     run.doc.Data().Assign(c);
     EXPECT_DOUBLE_EQ(9806.65, run.dlg.GetGravity(1));
-}
-
-TEST(PushOverCurveDlg, ThePlottedCurveMayBeOfAnotherType)
-{
-    T_EVAL_D eval = Eval(PUSH_METHOD::Ec8Opcm);
-    eval.plotType = 2;
-    T_RUN run(Plastic(), eval);
-    ASSERT_EQ(1, run.result);
-    EXPECT_EQ(PLOT_TYPE::Drift, run.R().curve.type);
-    EXPECT_DOUBLE_EQ(0.03 / 9, run.R().curve.x.at(1));
-    EXPECT_DOUBLE_EQ(0.2, run.R().curve.y.at(1));
-    EXPECT_NEAR(0.03 / kGamma, run.R().capacity.Sd.at(1), 1e-15); // the evaluation keeps its own
 }

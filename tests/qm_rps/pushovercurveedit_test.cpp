@@ -96,21 +96,19 @@ TEST(PushOverCurveEdit, ACurveWithoutSpectrumKeepsTheLastPictureButNotItsValues)
 TEST(PushOverCurveEdit, AnotherMethodTakesAProcedureAndPlotThatItHas)
 {
     T_EDIT edit;
+    const T_EVAL_D& e = edit->m_settings;
     edit->m_methodPage.ChangeMethod(PUSH_METHOD::Fema440);
     edit->m_settings.procedure = 'C';
     edit->m_settings.plotType = 4;
     edit->m_methodPage.ChangeMethod(PUSH_METHOD::Atc40);
-    EXPECT_EQ(std::nullopt, edit->m_settings.procedure);
-    EXPECT_EQ(std::nullopt, edit->m_settings.plotType);
+    EXPECT_FALSE(e.procedure || e.plotType);
     edit->m_settings.procedure = 'B';
     edit->m_settings.plotType = 2; // not of a method
     edit->m_methodPage.ChangeMethod(PUSH_METHOD::Fema440);
-    EXPECT_EQ('B', edit->m_settings.procedure);
+    EXPECT_EQ('B', e.procedure);
     edit->m_methodPage.ChangeMethod(PUSH_METHOD::Ec8Opcm);
-    EXPECT_EQ(std::nullopt, edit->m_settings.procedure);
-    EXPECT_EQ(2, edit->m_settings.plotType);
-    edit->OnEdited();
-    EXPECT_EQ("", edit->Shown().Refusal());
+    EXPECT_EQ(std::nullopt, e.procedure);
+    EXPECT_EQ(2, e.plotType);
 }
 
 TEST(PushOverCurveEdit, StoringIsOneUndoableEditAndAsksBeforeItReplaces)
@@ -179,13 +177,12 @@ TEST(PushOverCurveEdit, TheDocumentIsFollowedWhenItChanges)
 {
     T_EDIT edit;
     EXPECT_EQ(0, edit->OnDocumentChanged());
-    ASSERT_EQ(1, edit.doc.Edit().Begin("spectrum"));
-    ASSERT_EQ(1, edit.doc.Edit().Put(1, T_SPFC_D{"U", T_SPFC_USER{{0, 4}, {0.1, 0.1}, {}}}));
-    ASSERT_EQ(1, edit.doc.Edit().Commit());
+    T_MODEL_CONTENT other = Plastic();
     const double before = edit->Shown().Result().point->Sa;
+    std::swap(other.model.spectra[1].data, other.model.spectra[2].data);
+    edit.doc.Data().Assign(other);
     EXPECT_EQ(1, edit->OnDocumentChanged());
     EXPECT_NEAR(before / 2, edit->Shown().Result().point->Sa, 1e-12);
-    T_MODEL_CONTENT other = Plastic();
     other.model.pushovers[1].name = "PY";
     edit.doc.Data().Assign(other);
     EXPECT_EQ(1, edit->OnDocumentChanged());

@@ -78,19 +78,6 @@ TEST(Bilinear, FitsByHand)
     }
 }
 
-TEST(Bilinear, AreaOfWholeAndCutTrapezoids)
-{
-    const T_ADRS_VIEW c = kTrilinear.View();
-    EXPECT_EQ(0.0, CurveArea(c, 0.0));
-    EXPECT_DOUBLE_EQ(0.00325, CurveArea(c, 0.02));
-    EXPECT_DOUBLE_EQ(0.012, CurveArea(c, 9.0)); // ends with the curve
-    // A curve that turns back ends with the segment that starts beyond d: 1.125 up, 1.5 back.
-    const T_ADRS_CURVE back{{0, 2, 1, 3}, {0, 2, 1, 4}};
-    EXPECT_DOUBLE_EQ(-0.375, CurveArea(back.View(), 1.5));
-    EXPECT_DOUBLE_EQ(0.25, CurveAccelAt(c, 0.02));
-    EXPECT_DOUBLE_EQ(0.3, CurveAccelAt(c, 9.0));
-}
-
 TEST(Bilinear, RefusesCurvesWithoutAYieldPoint)
 {
     const T_BILINEAR before{1, 2, 3, 4};

@@ -157,9 +157,3 @@ TEST(TargetDisp, FirstRiseThroughALevel)
     EXPECT_EQ(0.0, FindRise(d, V, 4.0));
     EXPECT_EQ(0.0, FindRise(d, std::array{3.0, 4.0, 5.0, 6.0}, 1.0)); // starts above
 }
-
-TEST(TargetDisp, BehaviourFactorThree)
-{
-    EXPECT_NEAR(0.15, CalcBehaviourDisp(kYield, kG, kT, kT, 3.0), 1e-15);       // 3 dy
-    EXPECT_NEAR(0.25, CalcBehaviourDisp(kYield, kG, kT, 2.0 * kT, 3.0), 1e-15); // dy (1 + 2*2)
-}

@@ -66,35 +66,6 @@ const T_MASONRY_CASE kMasonryCases[] = {
 
 } // namespace
 
-TEST(TargetEvaluation, Ec8DemandsAreByLimitStateAndTheirNearestSteps)
-{
-    T_TARGET_INPUT in = Input(BILINEAR_RULE::Ec8, kSmallDrifts); // dy = 0.02, ay = 0.2
-    in.spectra[0] = Constant(0.5, 0.1);
-    CPushOverTargetEvaluation e(in);
-    ASSERT_EQ(1, e.UpdateTargetDispDataEC8());
-    const T_TARGET_DISP& t = e.Targets().at(0);
-    EXPECT_NEAR(0.05, t.dt, 1e-15);
-    EXPECT_NEAR(0.2 * 10 * 3, t.Fy, 1e-14);
-    EXPECT_EQ(3.0, t.mStar);
-    EXPECT_EQ(1, t.iterations);
-    const double demands[] = {kGamma * 0.02, kGamma * 0.05, kGamma * 0.075};
-    ASSERT_EQ(3U, e.Rows().size());
-    for (std::size_t i = 0; i < 3; ++i) {
-        EXPECT_NEAR(demands[i], e.Rows()[i].demand.value(), 1e-15);
-        EXPECT_EQ(e.DemandSteps()[i], e.Rows()[i].demandStep);
-        EXPECT_FALSE(e.Rows()[i].capacity || e.Rows()[i].capacityStep);
-        EXPECT_EQ("", e.Rows()[i].remark);
-    }
-    EXPECT_EQ((std::vector<int>{2, 4, 6}), e.DemandSteps());
-    EXPECT_EQ(PUSH_OUTCOME::TargetFound, e.Outcome().code);
-    ASSERT_EQ(3U, e.GuideLines().size());
-    EXPECT_EQ("NC(Dem.)", e.GuideLines()[2].label);
-    EXPECT_NEAR(0.075, e.GuideLines()[2].Sd, 1e-15);
-
-    in.spectra[0] = {}; // not enabled
-    EXPECT_EQ(0, CPushOverTargetEvaluation(in).UpdateTargetDispDataEC8());
-}
-
 TEST(TargetEvaluation, MasonryCapacitiesAndRemarksByHand)
 {
     for (const T_MASONRY_CASE& c : kMasonryCases) {
