@@ -80,17 +80,6 @@ TEST(LoadCase, FindsEachRuleThatIsNotKept)
     }
 }
 
-TEST(LoadCase, ARefusedCaseIsNotWritten)
-{
-    CPO_LoadCaseDlg dlg;
-    dlg.Data2Dlg(Start(kAnyNode));
-    dlg.m_case.name = "";
-    P stored = Start(kForce);
-    EXPECT_EQ(0, dlg.Dlg2Data(stored));
-    EXPECT_EQ(Start(kForce), stored);
-    EXPECT_EQ(kName, dlg.Messages().at(0).key);
-}
-
 TEST(LoadCase, ChecksPatternRows)
 {
     const struct {

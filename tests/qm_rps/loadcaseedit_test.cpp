@@ -97,23 +97,6 @@ TEST_F(LoadCaseEdit, OkIsOneStepAndEvaluationsFollowTheName)
     EXPECT_FALSE(m_doc.Undo().CanUndo());
 }
 
-TEST_F(LoadCaseEdit, QuantitiesAreInTheDocumentsUnits)
-{
-    Open("hinge-library");
-    T_STYP_D styp;
-    ASSERT_EQ(1, m_doc.Attr().GetStyp(styp));
-    styp.units.length = LENGTH_UNIT::mm;
-    ASSERT_EQ(1, m_doc.Edit().Begin("units"));
-    ASSERT_EQ(1, m_doc.Edit().PutStyp(styp));
-    ASSERT_EQ(1, m_doc.Edit().Commit());
-    CPO_LoadCaseDlg dialog;
-    Start(dialog);
-    EXPECT_EQ(200.0, dialog.m_case.control->masterMaxDispl); // 0.2 m
-    dialog.m_case.control->masterMaxDispl = -50.0;
-    ASSERT_EQ(1, dialog.OnOK());
-    EXPECT_DOUBLE_EQ(-0.05, Model().pushovers.at(1).control->masterMaxDispl);
-}
-
 TEST_F(LoadCaseEdit, ANewCaseGetsAFreeKeyAndNameAndMustBeFilled)
 {
     Open("rc-frame-3-storey");

@@ -177,26 +177,25 @@ TEST(PerfPtBase, CapacityAccelerationIsNotFoundAtTheLastPoint)
 TEST(PerfPtBase, FirstSlopeChangeIsMeasuredRelativeToThePointBefore)
 {
     struct T_CASE {
-        const char* label;
         T_POINTS capacity;
         int result;
         T_POINT2 point;
         std::size_t assertions;
     };
     const T_CASE cases[] = {
-        {"one segment", {{1, 1}, {2, 2}}, 0, {0, 0}, 0},
-        {"turns at 2", {{1, 1}, {2, 2}, {3, 2.5}, {4, 4}}, 1, {2, 2}, 0}, // 1 against 0.5
-        {"by 0.09 only", {{1, 1}, {2, 2}, {3, 2.91}}, 0, {3, 2.91}, 0},   // 1 against 0.91
-        {"from the origin", {{0, 0}, {1, 1}, {2, 1.2}}, 0, {0, 0}, 1},
-        {"to zero", {{1, 1}, {2, 2}, {3, 3}, {4, 0}}, 1, {3, 3}, 0},
+        {{{1, 1}, {2, 2}}, 0, {0, 0}, 0},
+        {{{1, 1}, {2, 2}, {3, 2.5}, {4, 4}}, 1, {2, 2}, 0}, // 1 against 0.5
+        {{{1, 1}, {2, 2}, {3, 2.91}}, 0, {3, 2.91}, 0},     // 1 against 0.91
+        {{{0, 0}, {1, 1}, {2, 1.2}}, 0, {0, 0}, 1},         // from the origin
+        {{{1, 1}, {2, 2}, {3, 3}, {4, 0}}, 1, {3, 3}, 0},
     };
     for (const T_CASE& c : cases) {
         T_KIT k(c.capacity);
         TakeSources();
         T_POINT2 p;
-        EXPECT_EQ(c.result, k.calc.FindFirstSlopeChange(p.x, p.y)) << c.label;
-        EXPECT_EQ(c.point.x, p.x) << c.label;
-        EXPECT_EQ(c.point.y, p.y) << c.label;
-        EXPECT_EQ(c.assertions, TakeSources().size()) << c.label;
+        const std::string label = "row " + std::to_string(&c - cases);
+        EXPECT_EQ(c.result, k.calc.FindFirstSlopeChange(p.x, p.y)) << label;
+        EXPECT_EQ((std::pair{c.point.x, c.point.y}), (std::pair{p.x, p.y})) << label;
+        EXPECT_EQ(c.assertions, TakeSources().size()) << label;
     }
 }

@@ -1,7 +1,6 @@
 // FEMA 440 procedures a, b (MADRS crossing) and c (ductility locus).
 #include "perfptfixture.h"
 #include "qm_base/testenvmgr.h"
-#include "qm_rps/pushover/fema440coefficients.h"
 #include "tempfolder.h"
 
 #include <cmath>
@@ -87,19 +86,6 @@ TEST(PerfPtFema440, DampingOfThePointComesFromThe5PercentSpectrum)
         const double level = 3.0 * (5.6 - std::log(*t.betaEff)) / 4.0 * t.M.value_or(1.0);
         EXPECT_NEAR(level, record.WorkingDemand().Sa[1], 1e-12) << procedure;
     }
-}
-
-TEST(PerfPtFema440, AlphaInPercentSelectsTheRowByAHundredTimesTheRatio)
-{
-    CTestRecord record(Bilinear(10, 0.1, 0.04, 2000), Atc40(0.6));
-    const T_RUN ratio = RunProcedure(record, 'a');
-    EXPECT_NEAR(146.3129890843, ratio.D, 1e-6); // both from tests/oracle/evaluate.py
-    record.SetAlphaInPercent(true);
-    const T_RUN percent = RunProcedure(record, 'a');
-    EXPECT_EQ("bilinear, alpha <= 5", Fema440RowText(percent.trace[0].row.value()));
-    EXPECT_NEAR(131.9466001029, percent.D, 1e-6);
-    EXPECT_EQ(ratio.trace[0].alpha, percent.trace[0].alpha) << "the ratio itself is not scaled";
-    EXPECT_EQ(2, RunProcedure(record, 'c').trace[0].row);
 }
 
 TEST(PerfPtFema440, IterationLogIsExactToTheByte)

@@ -17,19 +17,15 @@ struct T_RECORD {
     int shown = 0, refreshed = 0, ended = 0;
 };
 
-class CRecordedWindow : public IRPSWindow {
-public:
-    CRecordedWindow(T_RECORD& record, CRPSDlgBase& dialog) : m_record(record), m_dialog(dialog) {}
-    ~CRecordedWindow() override
+struct T_WINDOW : IRPSWindow {
+    T_WINDOW(T_RECORD& record, CRPSDlgBase& dialog) : m_record(record), m_dialog(dialog) {}
+    ~T_WINDOW() override
     {
         ++m_record.ended;
-        EXPECT_NE(nullptr, m_dialog.Doc());
         (void)m_dialog.Findings(); // the dialog is still whole: a sanitizer sees it
     }
     void Show() override { ++m_record.shown; }
     void Refresh() override { ++m_record.refreshed; }
-
-private:
     T_RECORD& m_record;
     CRPSDlgBase& m_dialog;
 };
@@ -45,7 +41,7 @@ protected:
                 EXPECT_EQ(&m_doc, d.Doc()); // it has the document before its window is made
                 m_record.made.push_back(id);
                 errno = m_leaves;
-                return std::make_unique<CRecordedWindow>(m_record, d);
+                return std::make_unique<T_WINDOW>(m_record, d);
             });
     }
     CRPSDlgBase* Run(int id, const int* parameter = nullptr)

@@ -15,16 +15,6 @@ constexpr double kGravityMm = 9806.65; // mm/s2
 /// Gravity of the cases worked by hand: Sd = T2 Sa, so that a stiffness of 1 has a period of 1 s.
 constexpr double kGravityUnit = 4.0 * std::numbers::pi * std::numbers::pi;
 
-inline T_ADRS_CURVE Polyline(const T_POINTS& points)
-{
-    T_ADRS_CURVE curve;
-    for (const T_POINT2& p : points) {
-        curve.Sd.push_back(p.x);
-        curve.Sa.push_back(p.y);
-    }
-    return curve;
-}
-
 /// A thousandth of the first point as step 1, and a tenth of that before it, as the driver has it.
 /// The equal-area rule starts at the first stored point: so near the origin
 /// it misses 1e-8 of the elastic triangle.
@@ -47,7 +37,12 @@ public:
                 const T_DAMP_PARAM& damping = {}, double gravity = kGravityMm)
     {
         SetGravity(gravity, gravity);
-        SetCapacity(Polyline(capacity));
+        T_ADRS_CURVE curve;
+        for (const T_POINT2& p : capacity) {
+            curve.Sd.push_back(p.x);
+            curve.Sa.push_back(p.y);
+        }
+        SetCapacity(curve);
         SetDamping(damping);
         SetDesignSpectrum(
             MakeDesignSpectrum({"D", std::move(spectrum)}, damping.behaviorType, LIMIT_STATE::SLV));
@@ -64,7 +59,6 @@ struct T_RUN {
     int result = 0;
     double D = -1.0, A = -2.0; // as they were before the run
     std::optional<double> beta;
-    T_POINT2 slopeChange;
     T_OUTCOME outcome;
     std::vector<T_PERFPT_TRIAL> trace;
 };
@@ -74,7 +68,7 @@ T_RUN RunPerfPt(CPushOverPerfPtRecord& record, ARGS... args)
 {
     CALC calc(record, args...);
     T_RUN r;
-    r.result = calc.CalcPerformancePoint(r.D, r.A, r.beta, &r.slopeChange);
+    r.result = calc.CalcPerformancePoint(r.D, r.A, r.beta, nullptr);
     r.outcome = calc.Outcome();
     r.trace = calc.Trace();
     return r;

@@ -59,69 +59,71 @@ const T_FACTOR_CASE kFactorCases[] = {
 };
 // clang-format on
 
+class CurveData : public testing::Test {
+protected:
+    /// The curve of what the content holds now.
+    int Calc(const T_PUSH_CURVE_SETTINGS& settings)
+    {
+        m_doc.Data().Assign(m_content);
+        return m_curve.Calc(settings);
+    }
+    T_MODEL_CONTENT m_content = Sample();
+    T_POLC_D& m_push = m_content.model.pushovers[1];
+    CDBDoc m_doc;
+    CPushOverCurveData m_curve{m_doc};
+};
+
 } // namespace
 
-TEST(CurveData, FactorsByModeAndByMass)
+TEST_F(CurveData, FactorsByModeAndByMass)
 {
     for (const T_FACTOR_CASE& k : kFactorCases) {
-        CDBDoc doc;
-        T_MODEL_CONTENT c = Sample();
-        c.model.pushovers[1].patternKind = k.pattern;
-        c.model.pushovers[1].modes = k.modes;
-        doc.Data().Assign(c);
-        CPushOverCurveData curve(doc);
-        ASSERT_EQ(1, curve.Calc(Settings(k.type, k.eigen))) << k.label << curve.Error();
-        const T_PUSH_FACTORS& f = curve.Factors();
+        m_push.patternKind = k.pattern;
+        m_push.modes = k.modes;
+        ASSERT_EQ(1, Calc(Settings(k.type, k.eigen))) << k.label << m_curve.Error();
+        const T_PUSH_FACTORS& f = m_curve.Factors();
         ExpectNear({k.gamma, k.alpha}, {f.gamma, f.alpha}, k.label);
         EXPECT_DOUBLE_EQ(5.0, f.mass) << k.label; // not the restrained 7, not the unlisted 50
         EXPECT_DOUBLE_EQ(50.0, f.weight) << k.label;
         EXPECT_EQ(k.mode, f.mode) << k.label;
         EXPECT_EQ(k.eigenBased, f.eigenBased) << k.label;
-        EXPECT_EQ(k.eigenError, curve.EigenError()) << k.label;
-        EXPECT_EQ(k.conversionError, curve.ConversionError()) << k.label;
-        EXPECT_EQ(k.massError, curve.MassError()) << k.label;
+        EXPECT_EQ(k.eigenError, m_curve.EigenError()) << k.label;
+        EXPECT_EQ(k.conversionError, m_curve.ConversionError()) << k.label;
+        EXPECT_EQ(k.massError, m_curve.MassError()) << k.label;
     }
 }
 
-TEST(CurveData, RecordedParticipationIsUsedAsItStands)
+TEST_F(CurveData, RecordedParticipationIsUsedAsItStands)
 {
-    CDBDoc doc;
-    T_MODEL_CONTENT c = Sample();
-    c.model.modes[3].participation = T_DOF6{-0.5, 9}; // the largest in X by amount
-    c.model.modes[3].massPercent = T_DOF6{80.0};
-    doc.Data().Assign(c);
-    CPushOverCurveData curve(doc);
-    ASSERT_EQ(1, curve.Calc(Settings(P::Atc40)));
-    EXPECT_EQ(3, curve.Factors().mode);
-    EXPECT_DOUBLE_EQ(1.5, curve.Factors().gamma); // |3 * -0.5|
-    EXPECT_DOUBLE_EQ(0.8, curve.Factors().alpha);
+    m_content.model.modes[3].participation = T_DOF6{-0.5, 9}; // the largest in X by amount
+    m_content.model.modes[3].massPercent = T_DOF6{80.0};
+    ASSERT_EQ(1, Calc(Settings(P::Atc40)));
+    EXPECT_EQ(3, m_curve.Factors().mode);
+    EXPECT_DOUBLE_EQ(1.5, m_curve.Factors().gamma); // |3 * -0.5|
+    EXPECT_DOUBLE_EQ(0.8, m_curve.Factors().alpha);
 }
 
 // Shape -2, -1, 1 in X: S1 = -4 - 2 + 1, S2 = 8 + 2 + 1; the curve itself stays positive.
-TEST(CurveData, MassBasedGammaKeepsItsSignAndAVanishingOneIsAnError)
+TEST_F(CurveData, MassBasedGammaKeepsItsSignAndAVanishingOneIsAnError)
 {
-    CDBDoc doc;
-    T_MODEL_CONTENT c = Sample();
-    c.model.modes[2].shape = {{1, {-2}}, {2, {-1}}, {3, {1}}};
-    c.model.pushovers[1].patternKind = 2;
-    c.model.pushovers[1].modes = {2};
-    doc.Data().Assign(c);
-    CPushOverCurveData curve(doc);
-    ASSERT_EQ(1, curve.Calc(Settings(P::Atc40, false)));
-    EXPECT_DOUBLE_EQ(-5.0 / 11.0, curve.Factors().gamma);
-    EXPECT_DOUBLE_EQ(25.0 / 55.0, curve.Factors().alpha);
-    EXPECT_FALSE(curve.ConversionError());
-    EXPECT_DOUBLE_EQ(0.03 * 11.0 / 5.0, curve.Displacement()[1]);
-    ASSERT_EQ(1, curve.Calc(Settings(P::Atc40, true)));
-    EXPECT_DOUBLE_EQ(5.0 / 11.0, curve.Factors().gamma); // by the mode: its amount
+    m_content.model.modes[2].shape = {{1, {-2}}, {2, {-1}}, {3, {1}}};
+    m_push.patternKind = 2;
+    m_push.modes = {2};
+    ASSERT_EQ(1, Calc(Settings(P::Atc40, false)));
+    EXPECT_DOUBLE_EQ(-5.0 / 11.0, m_curve.Factors().gamma);
+    EXPECT_DOUBLE_EQ(25.0 / 55.0, m_curve.Factors().alpha);
+    EXPECT_FALSE(m_curve.ConversionError());
+    EXPECT_DOUBLE_EQ(0.03 * 11.0 / 5.0, m_curve.Displacement()[1]);
+    ASSERT_EQ(1, Calc(Settings(P::Atc40, true)));
+    EXPECT_DOUBLE_EQ(5.0 / 11.0, m_curve.Factors().gamma); // by the mode: its amount
 
-    c.model.modes[2].shape = {{1, {-0.7}}, {2, {0.6}}, {3, {0.2}}}; // -1.4 + 1.2 + 0.2, rounding
-    doc.Data().Assign(c);
-    ASSERT_EQ(1, curve.Calc(Settings(P::Atc40, false)));
-    EXPECT_TRUE(curve.ConversionError());
+    // -1.4 + 1.2 + 0.2, rounding
+    m_content.model.modes[2].shape = {{1, {-0.7}}, {2, {0.6}}, {3, {0.2}}};
+    ASSERT_EQ(1, Calc(Settings(P::Atc40, false)));
+    EXPECT_TRUE(m_curve.ConversionError());
 }
 
-TEST(CurveData, StartsAtATenthOfTheFirstStepAndTransformsByPlotType)
+TEST_F(CurveData, StartsAtATenthOfTheFirstStepAndTransformsByPlotType)
 {
     struct T_ROW {
         P type;
@@ -134,118 +136,85 @@ TEST(CurveData, StartsAtATenthOfTheFirstStepAndTransformsByPlotType)
         {P::Drift, 1.0 / 9, {0.02, 0.2, 0.36, 0.4}},  // control node 9 m from the ground
         {P::LoadFactor, 1.0, {0.05, 0.5, 1.0, 1.5}},
     };
-    CDBDoc doc;
-    doc.Data().Assign(Sample());
-    CPushOverCurveData curve(doc);
     for (const T_ROW& r : rows) {
-        ASSERT_EQ(1, curve.Calc(Settings(r.type)));
+        ASSERT_EQ(1, Calc(Settings(r.type)));
         const std::string label = std::to_string(static_cast<int>(r.type));
-        ExpectNear({0.003 * r.dx, 0.03 * r.dx, 0.09 * r.dx, 0.06 * r.dx}, curve.Displacement(),
+        ExpectNear({0.003 * r.dx, 0.03 * r.dx, 0.09 * r.dx, 0.06 * r.dx}, m_curve.Displacement(),
                    label);
-        ExpectNear(r.y, curve.Force(), label);
-        EXPECT_DOUBLE_EQ(0.09 * r.dx, curve.MaxDisplacement()) << label;
-        EXPECT_DOUBLE_EQ(r.y[3], curve.MaxForce()) << label;
-        EXPECT_EQ(3, curve.FirstDecreasingStep());
+        ExpectNear(r.y, m_curve.Force(), label);
+        EXPECT_DOUBLE_EQ(0.09 * r.dx, m_curve.MaxDisplacement()) << label;
+        EXPECT_DOUBLE_EQ(r.y[3], m_curve.MaxForce()) << label;
+        EXPECT_EQ(3, m_curve.FirstDecreasingStep());
     }
     double x = -2.0, y = -3.0;
-    curve.TransformByPlotType(P::BaseReaction, x, y); // not even made absolute
+    m_curve.TransformByPlotType(P::BaseReaction, x, y); // not even made absolute
     EXPECT_EQ(-5.0, x + y);
 }
 
-TEST(CurveData, ExtraNodesKeepTheirZeroAndRaiseTheLargestDisplacement)
+TEST_F(CurveData, ExtraNodesKeepTheirZeroAndRaiseTheLargestDisplacement)
 {
-    CDBDoc doc;
-    T_MODEL_CONTENT c = Sample();
     T_PUSH_DATA data;
     data.loadFactor = data.baseReaction = {1, 2};
     data.displacement = {{3, {0.1, 0.2}}, {1, {0.1, -0.7}}};
-    c.results[1] = MakePushResult(data);
-    doc.Data().Assign(c);
-    CPushOverCurveData curve(doc);
+    m_content.results[1] = MakePushResult(data);
     T_PUSH_CURVE_SETTINGS s = Settings(P::Atc40);
     s.extraNodes = {1.9, 5.0, -1.0, 0.0}; // kept as reals; 5 has no results
-    ASSERT_EQ(1, curve.Calc(s));
-    ExpectNear({0.0, 0.1 / kGamma, 0.7 / kGamma}, curve.ExtraDisplacement(0), "1");
+    ASSERT_EQ(1, Calc(s));
+    ExpectNear({0.0, 0.1 / kGamma, 0.7 / kGamma}, m_curve.ExtraDisplacement(0), "1");
     for (std::size_t i = 1; i < 4; ++i)
-        EXPECT_EQ((Numbers{0, 0, 0}), curve.ExtraDisplacement(i));
-    EXPECT_DOUBLE_EQ(0.7 / kGamma, curve.MaxDisplacement());
+        EXPECT_EQ((Numbers{0, 0, 0}), m_curve.ExtraDisplacement(i));
+    EXPECT_DOUBLE_EQ(0.7 / kGamma, m_curve.MaxDisplacement());
 }
 
-TEST(CurveData, WeightAndHeightHaveTheirFallBacks)
+TEST_F(CurveData, WeightAndHeightHaveTheirFallBacks)
 {
-    CDBDoc doc;
-    T_MODEL_CONTENT c = Sample();
-    for (auto& entry : c.model.nodes)
+    for (auto& entry : m_content.model.nodes)
         entry.second.mass[2] = 0.0;
-    c.model.nodes[3].xyz[2] = 0.0;
-    doc.Data().Assign(c);
-    CPushOverCurveData curve(doc);
+    m_content.model.nodes[3].xyz[2] = 0.0;
     T_PUSH_CURVE_SETTINGS s = Settings(P::Drift);
     for (const double weight : {40.0, 0.0}) {
         s.userWeight = weight;
-        ASSERT_EQ(1, curve.Calc(s));
-        EXPECT_DOUBLE_EQ(10.0 / (weight > 0.0 ? weight : 1e-19), curve.Force()[1]);
-        EXPECT_DOUBLE_EQ(0.03 / 1e-19, curve.Displacement()[1]);
+        ASSERT_EQ(1, Calc(s));
+        EXPECT_DOUBLE_EQ(10.0 / (weight > 0.0 ? weight : 1e-19), m_curve.Force()[1]);
+        EXPECT_DOUBLE_EQ(0.03 / 1e-19, m_curve.Displacement()[1]);
     }
 }
 
-TEST(CurveData, OtherDirections)
+TEST_F(CurveData, OtherDirections)
 {
-    CDBDoc doc;
-    CPushOverCurveData curve(doc);
     const auto calc = [&](int direction, bool eigen) {
-        T_MODEL_CONTENT c = Sample();
-        c.model.pushovers[1].direction = direction;
-        doc.Data().Assign(c);
-        ASSERT_EQ(1, curve.Calc(Settings(P::Atc40, eigen)));
+        m_push.direction = direction;
+        ASSERT_EQ(1, Calc(Settings(P::Atc40, eigen)));
     };
     calc(3, true);
-    EXPECT_EQ(P::LoadFactor, curve.PlotType()); // a vertical push has the load factor alone
-    EXPECT_DOUBLE_EQ(0.5, curve.Force()[1]);
+    EXPECT_EQ(P::LoadFactor, m_curve.PlotType()); // a vertical push has the load factor alone
+    EXPECT_DOUBLE_EQ(0.5, m_curve.Force()[1]);
     calc(2, true); // Y: masses 0.5 each, shape 1, 2, 3
-    EXPECT_EQ(1, curve.Factors().mode);
-    EXPECT_DOUBLE_EQ(3.0 * 6.0 / 14.0, curve.Factors().gamma);
-    EXPECT_DOUBLE_EQ(1.5, curve.Factors().mass);
+    EXPECT_EQ(1, m_curve.Factors().mode);
+    EXPECT_DOUBLE_EQ(3.0 * 6.0 / 14.0, m_curve.Factors().gamma);
+    EXPECT_DOUBLE_EQ(1.5, m_curve.Factors().mass);
     calc(5, false); // a rotation has no mass
-    EXPECT_TRUE(curve.ConversionError() && curve.MassError());
-    EXPECT_EQ((Numbers{0, 0, 0, 0}), curve.Force());
+    EXPECT_TRUE(m_curve.ConversionError() && m_curve.MassError());
+    EXPECT_EQ((Numbers{0, 0, 0, 0}), m_curve.Force());
 }
 
-TEST(CurveData, TellsWhatIsMissing)
+TEST_F(CurveData, RefusesWhatCanNotBeRead)
 {
-    CDBDoc doc;
-    T_MODEL_CONTENT c = Sample();
-    CPushOverCurveData curve(doc);
-    c.model.nodes[2].restraint[0] = 1; // the second storey keeps only restrained masses
-    doc.Data().Assign(c);
-    ASSERT_EQ(1, curve.Calc(Settings(P::Atc40, false)));
-    EXPECT_TRUE(curve.StoreyWithoutMass());
-    EXPECT_FALSE(curve.ConversionError() || curve.MassError());
-    ASSERT_EQ(1, curve.Calc(Settings(P::Atc40, true))); // asked for with mass-based factors only
-    EXPECT_FALSE(curve.StoreyWithoutMass());
-}
-
-TEST(CurveData, RefusesWhatCanNotBeRead)
-{
-    CDBDoc doc;
-    CPushOverCurveData curve(doc);
-    const auto errorOf = [&](const T_MODEL_CONTENT& c, int pushover) {
-        doc.Data().Assign(c);
+    const auto errorOf = [&](int pushover) {
         T_PUSH_CURVE_SETTINGS s = Settings(P::Atc40);
         s.pushover = pushover;
-        EXPECT_EQ(0, curve.Calc(s));
-        return curve.Error();
+        EXPECT_EQ(0, Calc(s));
+        return m_curve.Error();
     };
-    T_MODEL_CONTENT c = Sample();
-    EXPECT_EQ("no such pushover load case", errorOf(c, 2));
-    c.model.pushovers[1].controlNode = 5;
-    EXPECT_EQ("the control node has no results", errorOf(c, 1));
-    c.model.nodes.erase(5);
-    EXPECT_EQ("the control node is not in the model", errorOf(c, 1));
-    c = Sample();
-    c.results.clear();
-    EXPECT_EQ("the pushover load case has no results", errorOf(c, 1));
-    doc.Data().Assign(ThreeMasses({0.03, 0.03}, {10, 10})); // standing still is not going back
-    ASSERT_EQ(1, curve.Calc(Settings(P::BaseReaction)));
-    EXPECT_EQ(0, curve.FirstDecreasingStep());
+    EXPECT_EQ("no such pushover load case", errorOf(2));
+    m_push.controlNode = 5;
+    EXPECT_EQ("the control node has no results", errorOf(1));
+    m_content.model.nodes.erase(5);
+    EXPECT_EQ("the control node is not in the model", errorOf(1));
+    m_content = Sample();
+    m_content.results.clear();
+    EXPECT_EQ("the pushover load case has no results", errorOf(1));
+    m_content = ThreeMasses({0.03, 0.03}, {10, 10}); // standing still is not going back
+    ASSERT_EQ(1, Calc(Settings(P::BaseReaction)));
+    EXPECT_EQ(0, m_curve.FirstDecreasingStep());
 }
