@@ -7,12 +7,12 @@
 
 namespace {
 
-using E = T_PUSH_EVALUATION;
-using M = PUSH_METHOD;
+using EVALUATION = T_PUSH_EVALUATION;
+using enum PUSH_METHOD;
 
-E Base(PUSH_METHOD method)
+EVALUATION Base(PUSH_METHOD method)
 {
-    E e;
+    EVALUATION e;
     e.eval.method = method;
     e.loadCase = PushX("PX", 5);
     e.units = {FORCE_UNIT::kN, LENGTH_UNIT::m};
@@ -45,7 +45,7 @@ T_TARGET_DISP Target(double det, double dt, std::optional<double> qu)
     return t;
 }
 
-void NotFound(E& e)
+void NotFound(EVALUATION& e)
 {
     e.loadCase = PushX("Push 2", 7);
     e.loadCase.direction = 5;
@@ -53,14 +53,14 @@ void NotFound(E& e)
     e.units = {FORCE_UNIT::kips, LENGTH_UNIT::in};
 }
 
-void WithoutDamping(E& e)
+void WithoutDamping(EVALUATION& e)
 {
     e.result = 1;
     e.point = Point({});
     e.curve = {PLOT_TYPE::LoadFactor, {}, {}};
 }
 
-void Elastic(E& e)
+void Elastic(EVALUATION& e)
 {
     e.result = 2;
     e.loadCase.direction = 2;
@@ -68,7 +68,7 @@ void Elastic(E& e)
     e.point = Point(5.0);
 }
 
-void Masonry(E& e)
+void Masonry(EVALUATION& e)
 {
     e.result = 1;
     e.loadCase.patternKind = 3;
@@ -79,14 +79,14 @@ void Masonry(E& e)
                      {"q*=3", {}, 0.0625, {}, 3, ""}};
 }
 
-void Ec8NotFoundDrift(E& e)
+void Ec8NotFoundDrift(EVALUATION& e)
 {
     for (const char* state : {"DL", "SD", "NC"})
         e.limitStates.push_back({state, {}, {}, {}, {}, ""});
     e.curve = {PLOT_TYPE::Drift, {0.0, 0.004, 0.003}, {-0.5, 0.25, 0.125}};
 }
 
-void Ntc(E& e)
+void Ntc(EVALUATION& e)
 {
     e.result = 1;
     e.targets = {Target(0.008, 0.008, {}), {}, Target(0.016, 0.04, 1.5), Target(0.02, 0.02, {})};
@@ -99,13 +99,13 @@ void Ntc(E& e)
 const struct {
     const char* file; // written by hand from the formats of the report
     PUSH_METHOD method;
-    void (*make)(E&);
-} kGolden[] = {{"atc40_not_found", M::Atc40, NotFound},
-               {"atc40_no_damping", M::Atc40, WithoutDamping},
-               {"fema440_elastic", M::Fema440, Elastic},
-               {"ec8_masonry", M::Ec8Opcm, Masonry},
-               {"ec8_not_found_drift", M::Ec8Opcm, Ec8NotFoundDrift},
-               {"ntc2008", M::Ntc2008, Ntc}};
+    void (*make)(EVALUATION&);
+} kGolden[] = {{"atc40_not_found", Atc40, NotFound},
+               {"atc40_no_damping", Atc40, WithoutDamping},
+               {"fema440_elastic", Fema440, Elastic},
+               {"ec8_masonry", Ec8Opcm, Masonry},
+               {"ec8_not_found_drift", Ec8Opcm, Ec8NotFoundDrift},
+               {"ntc2008", Ntc2008, Ntc}};
 
 } // namespace
 
@@ -114,7 +114,7 @@ TEST(PushoverReport, IsTheGoldenTextToTheByte)
     for (const auto& g : kGolden) {
         const std::string text = ReadText(std::string(QM_RPS_GOLDEN) + "/" + g.file + ".txt");
         ASSERT_FALSE(text.empty()) << g.file;
-        E e = Base(g.method);
+        EVALUATION e = Base(g.method);
         g.make(e);
         EXPECT_EQ(text, PushoverReportText(e)) << g.file;
     }
