@@ -3,8 +3,8 @@
 #include "analysistext.h"
 #include "inputfile.h"
 #include "output.h"
+#include "qm_base/say.h"
 #include "qm_base/textformat.h"
-#include "say.h"
 #include "json/analysisjson.h"
 
 #ifdef QM_UI

@@ -1,6 +1,6 @@
 #include "analysisresults.h"
 
-#include "say.h"
+#include "qm_base/say.h"
 
 #include <algorithm>
 #include <set>

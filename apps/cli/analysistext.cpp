@@ -1,8 +1,8 @@
 #include "analysistext.h"
 
+#include "qm_base/say.h"
 #include "qm_base/textformat.h"
 #include "qm_db/records/structnames.h"
-#include "say.h"
 
 #include <algorithm>
 #include <cmath>

@@ -2,13 +2,13 @@
 
 #include "inputfile.h"
 #include "output.h"
+#include "qm_base/say.h"
 #include "qm_db/filectrl.h"
 #include "qm_rps/pushover/pushovercomparison.h"
 #include "qm_rps/pushover/pushoverreport.h"
 #include "qm_rps/pushovercalculators.h"
 #include "qm_rps/pushovercurvedlg.h"
 #include "resulttable.h"
-#include "say.h"
 #include "json/resultjson.h"
 
 #ifdef QM_UI

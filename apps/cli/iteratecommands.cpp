@@ -2,11 +2,11 @@
 
 #include "inputfile.h"
 #include "output.h"
+#include "qm_base/say.h"
 #include "qm_rps/factors/ulfitemchecks.h"
 #include "qm_rps/factors/ulfstageresults.h"
 #include "qm_rps/ulfiterationdochost.h"
 #include "qm_rps/unknownloadfactoriteranal.h"
-#include "say.h"
 #include "ulfrun.h"
 #include "json/jsontext.h"
 

@@ -1,9 +1,9 @@
 // qm-rps: the command line. Reads the arguments; the commands do the work.
 #include "output.h"
 #include "qm_base/msgfunction.h"
+#include "qm_base/say.h"
 #include "qm_rps/pushover/pushoverreport.h"
 #include "registrations.h"
-#include "say.h"
 
 #include <CLI/CLI.hpp>
 

@@ -2,10 +2,10 @@
 
 #include "inputfile.h"
 #include "output.h"
+#include "qm_base/say.h"
 #include "qm_db/casefile.h"
 #include "qm_db/modelstore.h"
 #include "qm_rps/pushover/pushevaluation.h"
-#include "say.h"
 
 #include <cstdio>
 

@@ -1,8 +1,8 @@
 #include "output.h"
 
 #include "inputfile.h"
+#include "qm_base/say.h"
 #include "qm_db/filectrl.h"
-#include "say.h"
 
 #ifdef QM_UI
 #include "qm_ui/plot/plotfile.h"

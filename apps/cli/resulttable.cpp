@@ -1,8 +1,8 @@
 #include "resulttable.h"
 
+#include "qm_base/say.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/pushover/fema440coefficients.h"
-#include "say.h"
 
 namespace {
 

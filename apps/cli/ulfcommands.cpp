@@ -3,12 +3,12 @@
 #include "inputfile.h"
 #include "output.h"
 #include "qm_base/messagehistory.h"
+#include "qm_base/say.h"
 #include "qm_rps/factors/ulfstageplace.h"
 #include "qm_rps/factors/ulftexts.h"
 #include "qm_rps/unknownloadfactoritemdlg.h"
 #include "qm_rps/unknownloadfactorresultdlg.h"
 #include "qm_rps/unknownstageitemdlg.h"
-#include "say.h"
 #include "ulfrun.h"
 #include "json/ulfjson.h"
 

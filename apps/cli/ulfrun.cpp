@@ -4,10 +4,10 @@
 #include "inputfile.h"
 #include "output.h"
 #include "qm_base/msgfunction.h"
+#include "qm_base/say.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/unknownloadfactoritemdlg.h"
 #include "qm_rps/unknownstageitemdlg.h"
-#include "say.h"
 
 #include <algorithm>
 

@@ -1,10 +1,10 @@
 #include "verifycommand.h"
 
 #include "inputfile.h"
+#include "qm_base/say.h"
 #include "qm_base/textformat.h"
 #include "qm_db/filectrl.h"
 #include "qm_rps/pushovercurvedlg.h"
-#include "say.h"
 #include "json/resultjson.h"
 
 #include <nlohmann/json.hpp>
