@@ -4,8 +4,7 @@ const char* CCaseGet::OptOr(const char* key, const char* old, double& out, doubl
                             T_DIM dim)
 {
     const bool older = old && Has(old);
-    if (older && Has(key))
-        m_in.FailAt(key, std::string("the same as \"") + old + "\", which is there too");
+    if (older && Has(key)) m_in.FailAt(key, "IDS_QM_CASE_SAME_AS", old);
     Opt(older ? old : key, out, missing, dim);
     return older ? old : key;
 }
@@ -59,18 +58,19 @@ void CCaseGet::StageStep(const char* key, int& step, int missing)
     if (!Has(key)) return;
     CJsonReader member = m_in.Member(key);
     if (member.IsText()) {
-        step = member.Choice(kStageStepNames, "step") == 0 ? kStageFirstStep : kStageLastStep;
+        step = member.Choice(kStageStepNames, "IDS_QM_CHOICE_STEP") == 0 ? kStageFirstStep
+                                                                         : kStageLastStep;
         return;
     }
     member.Read(step);
-    if (step < kStageFirstStep) member.Fail("steps count from 1");
+    if (step < kStageFirstStep) member.Fail("IDS_QM_CASE_STEPS_FROM_1");
 }
 
 void CCaseGet::NodeTable(const char* key, std::map<int, T_DOF6>& out)
 {
     if (!Take(key)) return;
     m_in.Member(key).ForEachNode([&](CJsonReader& values, int node) {
-        if (m_names && !m_names->HasNode(node)) values.Fail("there is no such node");
+        if (m_names && !m_names->HasNode(node)) values.Fail("IDS_QM_CASE_NO_NODE");
         values.Read(out[node]);
     });
 }
@@ -81,11 +81,11 @@ void CCaseGet::OptElements(const char* key, std::vector<int>& ids)
     if (!Has(key)) return;
     Need(key, ids);
     CheckIds(
-        key, ids, [&](int id) { return m_names->HasElement(id); }, "there is no such element",
-        "the element appears twice");
+        key, ids, [&](int id) { return m_names->HasElement(id); }, "IDS_QM_CASE_NO_ELEMENT",
+        "IDS_QM_CASE_ELEMENT_TWICE");
 }
 
 void CCaseGet::FailRef(CJsonReader& in, RECORD_KIND kind)
 {
-    WithKind(kind, [&](const auto& row) { in.Fail("there is no such " + std::string(row.noun)); });
+    WithKind(kind, [&](const auto& row) { in.Fail("IDS_QM_CASE_NO_RECORD", Say(row.noun)); });
 }

@@ -144,19 +144,19 @@ public:
     void Node(const char* key, int& id)
     {
         Need(key, id);
-        if (m_names) m_in.Check(key, m_names->HasNode(id), "there is no such node");
+        if (m_names) m_in.Check(key, m_names->HasNode(id), "IDS_QM_CASE_NO_NODE");
     }
     void Element(const char* key, int& id)
     {
         Need(key, id);
-        if (m_names) m_in.Check(key, m_names->HasElement(id), "there is no such element");
+        if (m_names) m_in.Check(key, m_names->HasElement(id), "IDS_QM_CASE_NO_ELEMENT");
     }
     void NodeList(const char* key, std::vector<int>& ids)
     {
         Need(key, ids);
         CheckIds(
-            key, ids, [&](int id) { return m_names->HasNode(id); }, "there is no such node",
-            "the node appears twice");
+            key, ids, [&](int id) { return m_names->HasNode(id); }, "IDS_QM_CASE_NO_NODE",
+            "IDS_QM_CASE_NODE_TWICE");
     }
     void OptNodes(const char* key, std::vector<int>& ids)
     {
@@ -291,7 +291,7 @@ public:
         CJsonReader member = m_in.Member(key);
         Read(member, values, dim);
         if (values.size() > N)
-            return member.Fail(std::to_string(values.size()) + " values, expected up to " +
+            return member.Fail("IDS_QM_JSON_COUNT_UP_TO", std::to_string(values.size()),
                                std::to_string(N));
         std::copy(values.begin(), values.end(), out.begin());
     }
@@ -356,7 +356,7 @@ private:
     static void Convert(CJsonReader& in, double& value, double factor)
     {
         value *= factor;
-        if (!std::isfinite(value)) in.Fail("a value is too large");
+        if (!std::isfinite(value)) in.Fail("IDS_QM_CASE_TOO_LARGE");
     }
 
     CJsonReader& m_in;

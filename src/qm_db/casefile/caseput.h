@@ -36,7 +36,8 @@ public:
     {
     }
 
-    void Fail(const std::string& reason) { m_out.Fail(reason); }
+    /// The reason is a catalogue key.
+    void Fail(const char* reason) { m_out.Fail(reason); }
 
     template <class T>
     void Need(const char* key, const T& value, T_DIM dim = kDimNone)
@@ -113,7 +114,7 @@ public:
         if (!m_names) return Need(key, target);
         Begin(key);
         const std::string* const name = m_names->NameOf(kind, target);
-        if (!name) return m_out.Fail("no name for the key " + std::to_string(target));
+        if (!name) return m_out.Fail("IDS_QM_CASE_NO_NAME_OF_KEY", std::to_string(target));
         m_out.Value(std::string_view(*name));
     }
     void KeyRef(const char* key, int target, RECORD_KIND) { Need(key, target); }
@@ -143,7 +144,7 @@ public:
         if (step > kStageFirstStep) return Need(key, step);
         Begin(key);
         if (step != kStageFirstStep && step != kStageLastStep)
-            return m_out.Fail("there is no step " + std::to_string(step));
+            return m_out.Fail("IDS_QM_CASE_NO_STEP", std::to_string(step));
         m_out.Value(kStageStepNames[step == kStageFirstStep ? 0 : 1]);
     }
     template <class... A>
@@ -306,7 +307,7 @@ private:
     {
         Begin(key);
         if (index < 0 || static_cast<std::size_t>(index) >= names.size())
-            return m_out.Fail("no name for the value " + std::to_string(index));
+            return m_out.Fail("IDS_QM_CASE_NO_NAME_OF_VALUE", std::to_string(index));
         m_out.Value(names[static_cast<std::size_t>(index)]);
     }
     /// The parts that were waiting for their first member, then the key.

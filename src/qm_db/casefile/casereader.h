@@ -35,7 +35,7 @@ void RecordToSiChecked(CJsonReader& in, T& record, const T_UNITS& units)
 {
     RecordToSi(record, units);
     ForEachQuantity(record, [&](double& v, T_DIM) {
-        if (!std::isfinite(v)) in.Fail("a value is too large");
+        if (!std::isfinite(v)) in.Fail("IDS_QM_CASE_TOO_LARGE");
     });
 }
 

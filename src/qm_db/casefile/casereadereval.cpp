@@ -24,9 +24,9 @@ void Judge(CJsonReader& in, std::string_view key, const T_EVAL_D& eval)
 void JudgeEvaluation(CJsonReader& in, const T_MODEL& model, const T_EVAL_D& eval)
 {
     if (!HasName(model.pushovers, eval.push))
-        in.FailAt("push", "there is no pushover load case " + QuotedText(eval.push));
+        in.FailAt("push", "IDS_QM_CASE_NO_PUSHOVER", QuotedText(eval.push));
     if (!HasName(model.spectra, eval.spectrum))
-        in.FailAt("spectrum", "there is no spectrum " + QuotedText(eval.spectrum));
+        in.FailAt("spectrum", "IDS_QM_CASE_NO_SPECTRUM", QuotedText(eval.spectrum));
     for (const char* const key :
          {"behavior", "elastic_damping", "user_damping", "drift_kind", "plot_type"})
         Judge(in, key, eval);

@@ -11,21 +11,21 @@ void CheckRecord(CJsonReader&, const R&)
 }
 void CheckRecord(CJsonReader& in, const T_ELEM_D& e)
 {
-    in.Check("id", e.id > 0, "an element id must be above 0");
+    in.Check("id", e.id > 0, "IDS_QM_CASE_ELEMENT_ID");
 }
 void CheckRecord(CJsonReader& in, const T_POFC_D& f)
 {
     if (f.step.size() != f.factor.size())
-        in.FailAt("factor", std::to_string(f.factor.size()) + " values, expected " +
-                                std::to_string(f.step.size()));
+        in.FailAt("factor", "IDS_QM_JSON_COUNT", std::to_string(f.factor.size()),
+                  std::to_string(f.step.size()));
 }
 
 void CheckRecord(CJsonReader& in, const T_SPFC_D& spectrum)
 {
     const auto* const user = std::get_if<T_SPFC_USER>(&spectrum.data);
     if (user && user->Sa.size() != user->T.size())
-        in.FailAt("Sa", std::to_string(user->Sa.size()) + " values, expected " +
-                            std::to_string(user->T.size()));
+        in.FailAt("Sa", "IDS_QM_JSON_COUNT", std::to_string(user->Sa.size()),
+                  std::to_string(user->T.size()));
 }
 
 /// Names and keys of a table that is read already.
@@ -56,7 +56,7 @@ void CheckCycles(CJsonReader& root, const T_MODEL& model)
     ForEachRecord(root, "combinations", [&](CJsonReader& item, std::size_t) {
         T_LCOM_D flat;
         std::string reason;
-        if (!FlattenLcom(model, (combination++)->second, flat, reason)) item.Fail(reason);
+        if (!FlattenLcom(model, (combination++)->second, flat, reason)) item.FailWith(reason);
     });
 }
 
@@ -65,7 +65,7 @@ void ReadHead(CJsonReader& root, T_MODEL& model)
     std::string format;
     root.Get("format", format);
     if (format != kCaseFormat)
-        root.FailAt("format", QuotedText(format) + ", expected " + QuotedText(kCaseFormat));
+        root.FailAt("format", "IDS_QM_CASE_FORMAT", QuotedText(format), QuotedText(kCaseFormat));
     const CCaseNames names(model);
     CCaseGet get(root, model.styp.units, {}, &names);
     HeadFields(get, model.styp);

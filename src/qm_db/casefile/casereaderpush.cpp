@@ -7,13 +7,12 @@ constexpr int kFirstModeKind = 2; // "mode" and "mode x story mass" need mode nu
 void CheckPattern(CJsonReader in, const T_MODEL& model, const T_POLC_D& push)
 {
     if (push.patternKind >= kFirstModeKind && push.modes.empty())
-        in.Fail("this kind of pattern needs at least one mode number in \"modes\"");
+        in.Fail("IDS_QM_CASE_NEEDS_MODES");
     in.CheckEach(
-        "modes", push.modes, [](int m) { return m > 0; }, "mode numbers start at 1");
+        "modes", push.modes, [](int m) { return m > 0; }, "IDS_QM_CASE_MODES_FROM_1");
     if (model.modes.empty()) return; // numbers of the solver that made the results
     in.CheckEach(
-        "modes", push.modes, [&](int m) { return model.modes.contains(m); },
-        "there is no such mode");
+        "modes", push.modes, [&](int m) { return model.modes.contains(m); }, "IDS_QM_CASE_NO_MODE");
 }
 
 } // namespace
@@ -22,7 +21,7 @@ void ReadSteps(CJsonReader& in, const CCaseNames& names, const std::string& fold
                const T_POLC_D& push, T_MODEL_CONTENT& content)
 {
     T_MODEL& model = content.model;
-    in.Check("control_node", model.nodes.contains(push.controlNode), "there is no such node");
+    in.Check("control_node", model.nodes.contains(push.controlNode), "IDS_QM_CASE_NO_NODE");
     CheckPattern(in.Member("pattern"), model, push);
     if (in.Has("steps") || !push.control) { // a case with "control" may still have to be run
         T_PUSH_DATA data;

@@ -28,9 +28,9 @@ public:
     CRecorderSource(CJsonReader& files, const std::string& folder) : m_folder(folder)
     {
         files.GetIf("skip_rows", m_skipRows);
-        files.Check("skip_rows", m_skipRows >= 0, "the number of rows can't be negative");
+        files.Check("skip_rows", m_skipRows >= 0, "IDS_QM_CASE_SKIP_ROWS");
         if (files.Has("first_row")) {
-            files.Choice("first_row", std::array{kStateBeforePush}, "first row");
+            files.Choice("first_row", std::array{kStateBeforePush}, "IDS_QM_CHOICE_FIRST_ROW");
             m_subtractFirst = true;
         }
     }
@@ -56,22 +56,20 @@ private:
         CRecorderFile& file = m_files[path];
         T_FILE_ERROR error;
         if (!file.IsLoaded() && !file.Load(m_folder, path, m_skipRows, error)) {
-            in.Fail(error.text, error.fault);
+            in.FailWith(error.text, error.fault);
             return nullptr;
         }
         if (m_firstPath.empty()) m_firstPath = path;
         const CRecorderFile& first = m_files[m_firstPath];
         if (file.RowCount() != first.RowCount())
-            in.Fail(path + ": " + std::to_string(file.RowCount()) + " rows up to line " +
-                    std::to_string(file.LastLine()) + ", expected " +
-                    std::to_string(first.RowCount()) + " as in " + m_firstPath);
+            in.Fail("IDS_QM_CASE_ROWS", path, std::to_string(file.RowCount()),
+                    std::to_string(file.LastLine()), std::to_string(first.RowCount()), m_firstPath);
         return &file;
     }
 
     static void AddColumns(CJsonReader& in, const CRecorderFile& file, T_SERIES& sum)
     {
-        if (in.Has("column") == in.Has("columns"))
-            return in.Fail("expected either \"column\" or \"columns\"");
+        if (in.Has("column") == in.Has("columns")) return in.Fail("IDS_QM_CASE_COLUMN_EITHER");
         const auto add = [&](CJsonReader& item, std::size_t) { AddColumn(item, file, sum); };
         if (in.Has("columns")) return in.Member("columns").ForEachItem(add);
         CJsonReader column = in.Member("column");
@@ -85,12 +83,12 @@ private:
         T_FILE_ERROR error;
         if (in.IsText()) {
             in.Read(name);
-            if (!file.FindColumn(name, column, error)) return in.Fail(error.text);
+            if (!file.FindColumn(name, column, error)) return in.FailWith(error.text);
         } else {
             in.Read(column);
-            if (column < 1) in.Fail("columns count from 1");
+            if (column < 1) in.Fail("IDS_QM_CASE_COLUMNS_FROM_1");
         }
-        if (!in.Failed() && !file.AddColumn(column, sum, error)) in.Fail(error.text);
+        if (!in.Failed() && !file.AddColumn(column, sum, error)) in.FailWith(error.text);
     }
 
     static void Scale(CJsonReader& in, T_SERIES& values)
@@ -123,10 +121,10 @@ void ReadSeries(CJsonReader& in, ISeriesSource& source, std::optional<std::size_
 {
     source.Read(in, out);
     if (count && out.size() != *count)
-        in.Fail(std::to_string(out.size()) + " values, expected " + std::to_string(*count));
+        in.Fail("IDS_QM_JSON_COUNT", std::to_string(out.size()), std::to_string(*count));
     for (double& value : out) {
         value *= factor;
-        if (!std::isfinite(value)) return in.Fail("a value is too large");
+        if (!std::isfinite(value)) return in.Fail("IDS_QM_CASE_TOO_LARGE");
     }
 }
 
@@ -138,15 +136,13 @@ bool IsAllZero(const T_SERIES& values)
 /// A curve without displacement or force has no stiffness: nothing can be evaluated.
 void CheckCurve(CJsonReader& in, const T_POLC_D& push, const T_PUSH_DATA& data)
 {
+    const std::string node = std::to_string(push.controlNode);
     const auto control = data.displacement.find(push.controlNode);
     if (control == data.displacement.end())
-        return in.FailAt("displacement",
-                         "the control node " + std::to_string(push.controlNode) + " is missing");
+        return in.FailAt("displacement", "IDS_QM_CASE_CONTROL_MISSING", node);
     if (IsAllZero(control->second))
-        in.FailAt("displacement", "a curve of zero displacement: the control node " +
-                                      std::to_string(push.controlNode) + " never moves");
-    if (IsAllZero(data.baseReaction))
-        in.FailAt("base_reaction", "a curve of zero force: every base reaction is 0");
+        in.FailAt("displacement", "IDS_QM_CASE_ZERO_DISPLACEMENT", node);
+    if (IsAllZero(data.baseReaction)) in.FailAt("base_reaction", "IDS_QM_CASE_ZERO_FORCE");
 }
 
 void ReadTables(CJsonReader& in, ISeriesSource& source, const T_MODEL& model, const T_POLC_D& push,
@@ -155,7 +151,7 @@ void ReadTables(CJsonReader& in, ISeriesSource& source, const T_MODEL& model, co
     CJsonReader factors = in.Member("load_factor");
     ReadSeries(factors, source, std::nullopt, 1.0, out.loadFactor);
     const std::size_t count = out.loadFactor.size();
-    if (count == 0) factors.Fail("there is no step");
+    if (count == 0) factors.Fail("IDS_QM_CASE_NO_STEPS");
 
     const T_UNITS& units = model.styp.units;
     CJsonReader reactions = in.Member("base_reaction");
@@ -163,7 +159,7 @@ void ReadTables(CJsonReader& in, ISeriesSource& source, const T_MODEL& model, co
                out.baseReaction);
     const double factor = SiFactor(units, DisplacementDim(push.direction));
     in.Member("displacement").ForEachNode([&](CJsonReader& values, int node) {
-        if (!model.nodes.contains(node)) values.Fail("there is no such node");
+        if (!model.nodes.contains(node)) values.Fail("IDS_QM_CASE_NO_NODE");
         ReadSeries(values, source, count, factor, out.displacement[node]);
     });
     CheckCurve(in, push, out);

@@ -40,7 +40,7 @@ inline int ReadKey(CJsonReader& item, int last)
 {
     int key = last + 1;
     item.GetIf("key", key);
-    item.Check("key", key > last, "keys must rise, from 1");
+    item.Check("key", key > last, "IDS_QM_CASE_KEYS_RISE");
     return key;
 }
 
@@ -88,7 +88,7 @@ void ReadTable(CJsonReader& root, const CCaseNames& names, const T_RECORD_ROW<R>
         if (row.key == CASE_KEY::Stated) key = ReadKey(item, key - 1);
         check(item, key, record);
         if (!table.try_emplace(key, std::move(record)).second && row.key == CASE_KEY::Member)
-            item.FailAt("id", std::string(row.noun) + ' ' + std::to_string(key) + " appears twice");
+            item.FailAt("id", "IDS_QM_CASE_RECORD_TWICE", Say(row.noun), std::to_string(key));
     };
     if (std::is_same_v<R, T_NODE_D>)
         root.Member(row.member).ForEachItem(read); // a model has nodes

@@ -20,8 +20,7 @@ void WriteMore(CJsonWriter& out, const T_MODEL_CONTENT& content, int key, const 
     if (hasSteps)
         WriteSteps(out, *it->second, push.direction);
     else if (!push.control)
-        out.Fail("the load case \"" + push.name +
-                 "\" has no results, which a case file can't leave out");
+        out.Fail("IDS_QM_CASE_NO_RESULTS", push.name);
     const auto steps = content.model.poverSteps.find(key);
     if (out.Failed() || steps == content.model.poverSteps.end()) return;
     CCasePut put(out);
@@ -33,8 +32,8 @@ void WriteName(CJsonWriter& out, const R& record, std::set<std::string>& taken, 
 {
     out.Member("name", record.name);
     if (key != CASE_KEY::Stated) return;
-    if (record.name.empty()) out.Fail("a name can't be empty");
-    if (!taken.insert(record.name).second) out.Fail("the name appears twice");
+    if (record.name.empty()) out.Fail("IDS_QM_JSON_NAME_EMPTY");
+    if (!taken.insert(record.name).second) out.Fail("IDS_QM_CASE_NAME_TWICE");
 }
 
 template <class R>
@@ -58,7 +57,7 @@ void WriteTable(CJsonWriter& out, const CCaseNames& names, const T_RECORD_ROW<R>
         out.EndObject();
         // The place of a mode in the array is its number, which load patterns name.
         if (std::is_same_v<R, T_EIGV_D> && key != next)
-            out.Fail("mode numbers must run 1, 2, 3, ...: found " + std::to_string(key));
+            out.Fail("IDS_QM_CASE_MODE_NUMBERS", std::to_string(key));
         next = key + 1;
     }
     out.EndArray();

@@ -10,9 +10,9 @@ void WriteSeries(CJsonWriter& out, const std::string& key, const T_SERIES& value
                  const IPushResult& result, int read)
 {
     out.Key(key);
-    if (!read) return out.Fail("the result can't be read: " + result.Error());
+    if (!read) return out.Fail("IDS_QM_CASE_RESULT_NOT_READ", result.Error());
     if (values.size() != static_cast<std::size_t>(result.StepCount()))
-        return out.Fail(std::to_string(values.size()) + " values, expected " +
+        return out.Fail("IDS_QM_JSON_COUNT", std::to_string(values.size()),
                         std::to_string(result.StepCount()));
     out.Value(values, dim);
 }

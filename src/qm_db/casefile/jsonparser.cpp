@@ -1,6 +1,6 @@
 #include "qm_db/casefile/jsonparser.h"
 
-#include "qm_base/textformat.h"
+#include "qm_base/say.h"
 #include "qm_db/file/jsonplace.h"
 
 #include <algorithm>
@@ -24,14 +24,14 @@ std::optional<std::string> DoubledKey(const T_JSON_MEMBERS& members)
     return std::string(*twice);
 }
 
-/// "line 3, column 7" of the byte before `offset`.
-std::string LineAndColumn(std::string_view text, std::size_t offset)
+/// "line 3, column 7: what", the place of the byte before `offset`.
+std::string AtOffset(std::string_view text, std::size_t offset, const std::string& what)
 {
     const std::string_view head = text.substr(0, std::min(offset, text.size()));
     const auto line = 1 + std::count(head.begin(), head.end(), '\n');
     const std::size_t lineStart = head.rfind('\n') + 1; // npos + 1 is 0
     const std::size_t column = std::max<std::size_t>(1, head.size() - lineStart);
-    return FormatText("line %ld, column %zu", static_cast<long>(line), column);
+    return Say("IDS_QM_JSON_LINE", std::to_string(line), std::to_string(column), what);
 }
 
 /// Where the first value deeper than the limit starts; the text before it is valid JSON.
@@ -91,7 +91,7 @@ public:
     bool end_object()
     {
         const auto twice = DoubledKey(std::get<T_JSON_MEMBERS>(m_open.back()->data));
-        if (twice) m_fault = PlacePrefix() + "key \"" + EscapedText(*twice) + "\" appears twice";
+        if (twice) m_fault = PlacePrefix() + Say("IDS_QM_JSON_KEY_TWICE", EscapedText(*twice));
         m_open.pop_back();
         return m_fault.empty();
     }
@@ -102,7 +102,7 @@ public:
     }
     bool parse_error(std::size_t offset, const std::string&, const std::exception& reason)
     {
-        m_fault = LineAndColumn(m_text, offset) + ": " + ReasonOf(reason.what());
+        m_fault = AtOffset(m_text, offset, Say("IDS_QM_JSON_SYNTAX", ReasonOf(reason.what())));
         return false;
     }
 
@@ -125,8 +125,8 @@ private:
     bool Open(T_JSON value)
     {
         if (m_open.size() >= static_cast<std::size_t>(kJsonMaxDepth)) {
-            m_fault = LineAndColumn(m_text, OffsetOfTooDeep(m_text)) +
-                      FormatText(": nested deeper than %d levels", kJsonMaxDepth);
+            m_fault = AtOffset(m_text, OffsetOfTooDeep(m_text),
+                               Say("IDS_QM_JSON_DEEP", std::to_string(kJsonMaxDepth)));
             return false;
         }
         m_open.push_back(&Place(std::move(value)));
@@ -171,12 +171,11 @@ int ParseJson(std::string_view text, T_JSON& out, T_FILE_ERROR& error)
 {
     CJsonBuilder builder(text);
     if (text.starts_with("\xEF\xBB\xBF"))
-        builder.m_fault = "line 1, column 1: the text starts with a byte order mark, save it "
-                          "as UTF-8 without one";
+        builder.m_fault = AtOffset(text, 1, Say("IDS_QM_JSON_BYTE_ORDER"));
     else if (text.find_first_not_of(" \t\r\n") == text.npos)
-        builder.m_fault = "the file is empty";
+        builder.m_fault = Say("IDS_QM_JSON_EMPTY");
     else if (const auto zero = text.find('\0'); zero != text.npos) // the parser would stop there
-        builder.m_fault = LineAndColumn(text, zero + 1) + ": a zero byte";
+        builder.m_fault = AtOffset(text, zero + 1, Say("IDS_QM_JSON_ZERO_BYTE"));
     else
         nlohmann::json::sax_parse(text.data(), text.data() + text.size(), &builder);
     if (!builder.m_fault.empty()) {

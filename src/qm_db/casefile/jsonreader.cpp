@@ -10,8 +10,13 @@
 namespace {
 
 // In the order of the variant in T_JSON.
-constexpr std::array<const char*, 7> kKindNames{"null",     "true or false", "a number", "a text",
-                                                "an array", "an array",      "an object"};
+constexpr const char* kBool = "IDS_QM_JSON_BOOL";
+constexpr const char* kNumber = "IDS_QM_JSON_NUMBER";
+constexpr const char* kText = "IDS_QM_JSON_TEXT";
+constexpr const char* kArray = "IDS_QM_JSON_ARRAY";
+constexpr const char* kObject = "IDS_QM_JSON_OBJECT";
+constexpr std::array<const char*, 7> kKindNames{
+    "IDS_QM_JSON_NULL", kBool, kNumber, kText, kArray, kArray, kObject};
 
 bool IsInt(double value)
 {
@@ -34,14 +39,9 @@ std::string Joined(std::span<const char* const> names)
 
 } // namespace
 
-void CJsonReader::Fail(const std::string& reason, FILE_FAULT fault)
+void CJsonReader::FailWith(const std::string& words, FILE_FAULT fault)
 {
-    if (!Failed()) *m_error = {fault, m_place.empty() ? reason : m_place + ": " + reason};
-}
-
-void CJsonReader::FailAt(std::string_view key, const std::string& reason)
-{
-    if (!Failed()) CJsonReader(nullptr, MemberPlace(m_place, key), *m_error).Fail(reason);
+    if (!Failed()) *m_error = {fault, m_place.empty() ? words : m_place + ": " + words};
 }
 
 void CJsonReader::FailAtItem(std::string_view key, std::size_t index, const char* reason)
@@ -53,12 +53,12 @@ void CJsonReader::FailAtItem(std::string_view key, std::size_t index, const char
 void CJsonReader::FailType(const char* expected)
 {
     const std::size_t kind = m_value ? m_value->data.index() : 0;
-    Fail(FormatText("expected %s, found %s", expected, kKindNames[kind]));
+    Fail("IDS_QM_JSON_TYPE", Say(expected), Say(kKindNames[kind]));
 }
 
 void CJsonReader::FailCount(std::size_t found, std::size_t expected)
 {
-    Fail(FormatText("%zu values, expected %zu", found, expected));
+    Fail("IDS_QM_JSON_COUNT", std::to_string(found), std::to_string(expected));
 }
 
 void CJsonReader::Check(std::string_view key, bool ok, const char* reason)
@@ -79,26 +79,26 @@ T_JSON* CJsonReader::Find(std::string_view key) const
 void CJsonReader::Keys(std::span<const std::string_view> known)
 {
     const auto* members = m_value ? std::get_if<T_JSON_MEMBERS>(&m_value->data) : nullptr;
-    if (!members) return FailType("an object");
+    if (!members) return FailType(kObject);
     for (const T_JSON_MEMBER& member : *members) {
         if (std::find(known.begin(), known.end(), member.key) == known.end())
-            return Fail("unknown key " + QuotedText(member.key));
+            return Fail("IDS_QM_JSON_UNKNOWN_KEY", QuotedText(member.key));
     }
 }
 
 CJsonReader CJsonReader::Member(std::string_view key)
 {
     T_JSON* value = Find(key);
-    if (!value) Fail(QuotedText(key) + " is missing");
+    if (!value) Fail("IDS_QM_JSON_MISSING", QuotedText(key));
     return {value, MemberPlace(m_place, key), *m_error};
 }
 
 void CJsonReader::GetName(std::string_view key, std::string& out, std::set<std::string>& taken)
 {
     Get(key, out);
-    Check(key, !out.empty(), "a name can't be empty");
-    Check(key, !HasControl(out), "a name can't have control characters");
-    if (!taken.insert(out).second) FailAt(key, QuotedText(out) + " appears twice");
+    Check(key, !out.empty(), "IDS_QM_JSON_NAME_EMPTY");
+    Check(key, !HasControl(out), "IDS_QM_JSON_NAME_CONTROL");
+    if (!taken.insert(out).second) FailAt(key, "IDS_QM_JSON_TWICE", QuotedText(out));
 }
 
 int CJsonReader::Choice(std::span<const char* const> names, const char* what)
@@ -107,7 +107,7 @@ int CJsonReader::Choice(std::span<const char* const> names, const char* what)
     Read(text);
     const auto it = std::find(names.begin(), names.end(), text);
     if (it != names.end()) return static_cast<int>(it - names.begin());
-    Fail("unknown " + std::string(what) + ' ' + QuotedText(text) + "; allowed: " + Joined(names));
+    Fail("IDS_QM_JSON_CHOICE", Say(what), QuotedText(text), Joined(names));
     return 0;
 }
 
@@ -115,7 +115,7 @@ void CJsonReader::Read(double& out)
 {
     if (Failed()) return;
     const auto* number = m_value ? std::get_if<double>(&m_value->data) : nullptr;
-    if (!number) return FailType("a number");
+    if (!number) return FailType(kNumber);
     out = *number;
 }
 
@@ -124,7 +124,7 @@ void CJsonReader::Read(int& out)
     double number = 0.0;
     Read(number);
     if (Failed()) return;
-    if (!IsInt(number)) return Fail(ShortestText(number) + " is not an integer");
+    if (!IsInt(number)) return Fail("IDS_QM_JSON_NOT_INTEGER", ShortestText(number));
     out = static_cast<int>(number);
 }
 
@@ -132,7 +132,7 @@ void CJsonReader::Read(bool& out)
 {
     if (Failed()) return;
     const auto* flag = m_value ? std::get_if<bool>(&m_value->data) : nullptr;
-    if (!flag) return FailType("true or false");
+    if (!flag) return FailType(kBool);
     out = *flag;
 }
 
@@ -140,7 +140,7 @@ void CJsonReader::Read(std::string& out)
 {
     if (Failed()) return;
     const auto* text = m_value ? std::get_if<std::string>(&m_value->data) : nullptr;
-    if (!text) return FailType("a text");
+    if (!text) return FailType(kText);
     out = *text;
 }
 
@@ -169,6 +169,6 @@ int CJsonReader::NodeIdOf(const std::string& key)
     const char* const end = key.data() + key.size();
     const auto [stop, fault] = std::from_chars(key.data(), end, node);
     if (fault != std::errc{} || stop != end || node <= 0 || key.front() == '0')
-        Fail("the key must be a node id");
+        Fail("IDS_QM_JSON_NODE_KEY");
     return node;
 }

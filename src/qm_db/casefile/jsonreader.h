@@ -2,6 +2,7 @@
 // it every reading does nothing, so that a record's reading needs no check after each member.
 #pragma once
 
+#include "qm_base/say.h"
 #include "qm_db/casefile/jsonvalue.h"
 #include "qm_db/file/jsonplace.h"
 #include "qm_db/fileerror.h"
@@ -25,9 +26,21 @@ public:
     }
 
     bool Failed() const { return m_error->fault != FILE_FAULT::None; }
-    /// Records a fault of this value, or of its member `key`, unless there is one already.
-    void Fail(const std::string& reason, FILE_FAULT fault = FILE_FAULT::BadInput);
-    void FailAt(std::string_view key, const std::string& reason);
+    /// Records a fault of this value, or of its member `key`, unless there is one already. A reason
+    /// is a key of the message catalogue, here and below; `args` take its places.
+    template <class... ARGS>
+    void Fail(std::string_view reason, const ARGS&... args)
+    {
+        if (!Failed()) FailWith(Say(reason, args...));
+    }
+    template <class... ARGS>
+    void FailAt(std::string_view key, std::string_view reason, const ARGS&... args)
+    {
+        if (!Failed())
+            CJsonReader(nullptr, MemberPlace(m_place, key), *m_error).Fail(reason, args...);
+    }
+    /// The same with a reason in words.
+    void FailWith(const std::string& words, FILE_FAULT fault = FILE_FAULT::BadInput);
     /// A fault of the member unless `ok`; members that are left out are not judged.
     void Check(std::string_view key, bool ok, const char* reason);
     template <class T, class F>
@@ -64,7 +77,7 @@ public:
     }
     /// Reads a name (not empty, no control characters) that no other record of its table has.
     void GetName(std::string_view key, std::string& out, std::set<std::string>& taken);
-    /// Reads a text out of a list and gives its index; `what` names it ("unit").
+    /// Reads a text out of a list and gives its index; `what` names it, a catalogue key.
     int Choice(std::string_view key, std::span<const char* const> names, const char* what)
     {
         return Member(key).Choice(names, what);
@@ -134,7 +147,7 @@ void CJsonReader::ForEachItem(F&& f)
     if (Failed()) return;
     auto* items = m_value ? std::get_if<T_JSON_ITEMS>(&m_value->data) : nullptr;
     const auto* numbers = m_value ? std::get_if<T_JSON_NUMBERS>(&m_value->data) : nullptr;
-    if (!items && !numbers) return FailType("an array");
+    if (!items && !numbers) return FailType("IDS_QM_JSON_ARRAY");
     const std::size_t count = items ? items->size() : numbers->size();
     for (std::size_t i = 0; i < count && !Failed(); ++i) {
         T_JSON number; // items of a packed array are numbers
@@ -149,7 +162,7 @@ void CJsonReader::ForEachNode(F&& f)
 {
     if (Failed()) return;
     auto* members = m_value ? std::get_if<T_JSON_MEMBERS>(&m_value->data) : nullptr;
-    if (!members) return FailType("an object");
+    if (!members) return FailType("IDS_QM_JSON_OBJECT");
     for (T_JSON_MEMBER& entry : *members) {
         CJsonReader member(&entry.value, MemberPlace(m_place, entry.key), *m_error);
         const int node = member.NodeIdOf(entry.key);

@@ -11,7 +11,7 @@ constexpr std::size_t kLineWidth = 100;
 
 } // namespace
 
-void CJsonWriter::Fail(const std::string& reason)
+void CJsonWriter::FailWith(const std::string& words)
 {
     if (Failed()) return;
     std::string place;
@@ -19,7 +19,7 @@ void CJsonWriter::Fail(const std::string& reason)
         if (!level.isArray && level.count == 0) break; // an object that has just begun
         place = level.isArray ? ItemPlace(place, level.count - 1) : MemberPlace(place, level.key);
     }
-    m_error = {FILE_FAULT::BadInput, place.empty() ? reason : place + ": " + reason};
+    m_error = {FILE_FAULT::BadInput, place.empty() ? words : place + ": " + words};
 }
 
 void CJsonWriter::NewLine(std::size_t indent)
@@ -71,7 +71,7 @@ void CJsonWriter::Value(double value, T_DIM dim)
 {
     BeforeValue();
     const auto text = SiText(value, m_units, dim);
-    if (!text) return Fail("the value is not a finite number");
+    if (!text) return Fail("IDS_QM_JSON_NOT_FINITE");
     m_text += *text;
 }
 
@@ -104,7 +104,7 @@ void CJsonWriter::Value(std::span<const double> values, std::span<const T_DIM> d
     std::string joined;
     for (std::size_t i = 0; i < values.size(); ++i) {
         const auto text = SiText(values[i], m_units, dims.size() == 1 ? dims[0] : dims[i]);
-        if (!text) return Fail(ItemPlace("item ", i) + " is not a finite number");
+        if (!text) return Fail("IDS_QM_JSON_ITEM_NOT_FINITE", std::to_string(i));
         joined += i == 0 ? *text : ", " + *text;
     }
     AppendNumbers(joined);
@@ -160,6 +160,6 @@ void CJsonWriter::AppendText(std::string_view text)
     try {
         m_text += nlohmann::json(text).dump();
     } catch (const nlohmann::json::type_error&) { // the only refusal of a text
-        Fail("a text is not valid UTF-8");
+        Fail("IDS_QM_JSON_NOT_UTF8");
     }
 }

@@ -3,6 +3,7 @@
 // is kept.
 #pragma once
 
+#include "qm_base/say.h"
 #include "qm_db/fileerror.h"
 #include "qm_db/records/units.h"
 
@@ -54,8 +55,13 @@ public:
     }
 
     bool Failed() const { return m_error.fault != FILE_FAULT::None; }
-    /// Records a fault of the value that is being written, unless there is one already.
-    void Fail(const std::string& reason);
+    /// Records a fault of the value that is being written, unless there is one already. The reason
+    /// is a key of the message catalogue, whose places `args` take.
+    template <class... ARGS>
+    void Fail(std::string_view reason, const ARGS&... args)
+    {
+        if (!Failed()) FailWith(Say(reason, args...));
+    }
     const T_FILE_ERROR& Error() const { return m_error; }
     /// The text so far; the writer is used up.
     std::string TakeText() { return std::move(m_text); }
@@ -68,6 +74,8 @@ private:
         std::string key; // of the member that is being written
     };
 
+    /// The fault in words.
+    void FailWith(const std::string& words);
     void Begin(char bracket, bool oneLine);
     void End(char bracket);
     void BeforeValue();

@@ -10,7 +10,7 @@ namespace {
 
 constexpr const char* kUserPoints = "IDS_PUSHOVER_Wrong_Input_";
 constexpr const char* kFraction = "IDS_DB_PO_CURVE_PP_BETWEEN_0_1";
-constexpr const char* kFractionReason = "the fraction is above 0 and up to 1";
+constexpr const char* kFractionReason = "IDS_QM_CASE_FRACTION";
 
 using E = T_EVAL_D;
 
@@ -42,12 +42,12 @@ constexpr T_RECORD_RULE<E> kRules[] = {
     {{.message = "IDS_QM_EVAL_BEHAVIOR",
       .field = "behavior",
       .caseKey = "behavior",
-      .reason = "the behavior is 0, 1, 2 or 3"},
+      .reason = "IDS_QM_CASE_BEHAVIOR"},
      [](const E& e) { return IsBetween(e.behavior, 0, kUserBehavior); }},
     {{.message = "IDS_QM_UI_PUSH_BAD_DAMPING",
       .field = "elasticDamping",
       .caseKey = "elastic_damping",
-      .reason = "damping is 0 to 100 per cent"},
+      .reason = "IDS_QM_CASE_DAMPING_PCT"},
      [](const E& e) {
          const double pct = e.elasticDamping.value_or(0.0);
          return pct >= 0.0 && pct <= 100.0;
@@ -56,24 +56,24 @@ constexpr T_RECORD_RULE<E> kRules[] = {
     {{.message = kUserPoints,
       .field = "userDamping",
       .caseKey = "user_damping",
-      .reason = "both beta must be above 0"},
+      .reason = "IDS_QM_CASE_BETA_ABOVE_0"},
      ArePointsAbove0,
      [](const E& e) { return HasPoints(e) && ArePointsFinite(e); }},
     {{.message = kUserPoints,
       .field = "userDamping",
       .caseKey = "user_damping",
-      .reason = "beta2 is below beta1"},
+      .reason = "IDS_QM_CASE_BETA_ORDER"},
      [](const E& e) { return (*e.userDamping)[0] <= (*e.userDamping)[2]; },
      [](const E& e) { return HasPoints(e) && ArePointsFinite(e) && ArePointsAbove0(e); }},
     {{.message = "IDS_QM_EVAL_DRIFT_KIND",
       .field = "driftKind",
       .caseKey = "drift_kind",
-      .reason = "the drift kind is 1 or 2"},
+      .reason = "IDS_QM_CASE_DRIFT_KIND"},
      [](const E& e) { return IsBetween(e.driftKind, 1, 2); }},
     {{.message = "IDS_QM_EVAL_PLOT_TYPE",
       .field = "plotType",
       .caseKey = "plot_type",
-      .reason = "the plot type is 0 to 8"},
+      .reason = "IDS_QM_CASE_PLOT_TYPE"},
      [](const E& e) { return IsBetween(e.plotType, 0, 8); }},
     {{.message = kFraction,
       .field = "bilinear.secant",

@@ -23,5 +23,6 @@ std::vector<T_FINDING> OptionFindings(const T_EVAL_D& evaluation);
 /// The same after a load case or a spectrum that the model does not have.
 std::vector<T_FINDING> EvaluationFindings(const T_EVAL_D& evaluation, const T_MODEL& model);
 
-/// Why a case file's member "behavior", "elastic_damping" ... is refused; null: it is not.
+/// Why a case file's member "behavior", "elastic_damping" ... is refused, a catalogue key; null: it
+/// is not.
 const char* EvaluationFault(const T_EVAL_D& evaluation, std::string_view caseKey);

@@ -90,14 +90,14 @@ void CaseFields(V& v, T_FIELD_REF<V, T_SKEL_FEMA> r, const T_CURVE_DIMS& given)
     static const T_SKEL_FEMA d;
     v.Opt("symmetric", r.symmetric, d.symmetric);
     v.Opt("auto_yield", r.autoYield, d.autoYield);
-    v.EnumOpt("measure", r.measure, d.measure, kMeasureNames, "measure");
+    v.EnumOpt("measure", r.measure, d.measure, kMeasureNames, "IDS_QM_CHOICE_MEASURE");
     const T_CURVE_DIMS dims = DimsInMeasure(given, r.measure);
     CaseFields(v, r.sides, dims);
     v.Opt("strength_loss", r.strengthLoss, d.strengthLoss);
     v.EnumOpt("initial_stiffness", r.initStiffness, d.initStiffness, kStiffnessNames,
-              "initial stiffness");
+              "IDS_QM_CHOICE_STIFFNESS");
     v.Opt("asymmetric_stiffness", r.asymStiffness, d.asymStiffness);
-    v.EnumOpt("unload_type", r.unloadType, d.unloadType, kUnloadNames, "unloading type");
+    v.EnumOpt("unload_type", r.unloadType, d.unloadType, kUnloadNames, "IDS_QM_CHOICE_UNLOADING");
     v.Opt("unload_factor", r.unloadFactor, d.unloadFactor);
     v.Opt("unload_exponent", r.unloadExponent, d.unloadExponent);
     v.Opt("unload_proportion", r.unloadProportion, d.unloadProportion);
@@ -117,9 +117,9 @@ void CaseFields(V& v, T_FIELD_REF<V, T_SKEL_EC8> r, const T_CURVE_DIMS& given)
     v.Opt("symmetric", r.symmetric, d.symmetric);
     v.Opt("auto_yield", r.autoYield, d.autoYield);
     v.Opt("strength_loss", r.strengthLoss, d.strengthLoss);
-    v.EnumOpt("measure", r.measure, d.measure, kMeasureNames, "measure");
+    v.EnumOpt("measure", r.measure, d.measure, kMeasureNames, "IDS_QM_CHOICE_MEASURE");
     v.EnumOpt("initial_stiffness", r.initStiffness, d.initStiffness, kStiffnessNames,
-              "initial stiffness");
+              "IDS_QM_CHOICE_STIFFNESS");
     CaseFields(v, r.sides, DimsInMeasure(given, r.measure));
 }
 
@@ -147,8 +147,8 @@ void CaseFields(V& v, T_FIELD_REF<V, T_SKEL_MULTI> r, const T_CURVE_DIMS& dims)
     v.Opt("use_ultimate", r.useUltimate, d.useUltimate);
     v.Opt("use_deformation", r.useDeformation, d.useDeformation);
     v.EnumOpt("initial_stiffness", r.initStiffness, d.initStiffness, kStiffnessNames,
-              "initial stiffness");
-    v.EnumOpt("gap_sides", r.gapSides, d.gapSides, kGapNames, "gap side");
+              "IDS_QM_CHOICE_STIFFNESS");
+    v.EnumOpt("gap_sides", r.gapSides, d.gapSides, kGapNames, "IDS_QM_CHOICE_GAP_SIDE");
     CaseFields(v, r.sides, dims);
 }
 
@@ -167,12 +167,12 @@ void CaseFields(V& v, T_FIELD_REF<V, T_HINGE_COMPONENT> r, const T_CURVE_DIMS& d
     if constexpr (V::kReads) v.Must("type"); // before what depends on it
     if constexpr (V::kWrites) {
         if (!FitsType(r.curves.I, r.type) || !FitsType(r.curves.J, r.type))
-            v.Fail("a curve is not of the component's type");
+            v.Fail("IDS_QM_CASE_CURVE_TYPE");
     }
     v.Opt("active", r.active, true); // a component that is listed
-    v.Enum("type", r.type, kSkelNames, "curve type");
+    v.Enum("type", r.type, kSkelNames, "IDS_QM_CHOICE_CURVE");
     v.template EnumOpt<1>("location", r.location, HINGE_LOCATION::BothEnds, kLocationNames,
-                          "location");
+                          "IDS_QM_CHOICE_LOCATION");
     if constexpr (V::kReads) {
         r.curves.I = r.curves.J = MakeSkelCurve(r.type);
         const bool two = v.Has("I") || v.Has("J");
@@ -280,10 +280,12 @@ template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_PHGT_D> r)
 {
     static const T_PHGT_D d;
-    v.Code("element", r.element, kHingeElementNames, "element type");
-    v.EnumOpt("definition", r.definition, d.definition, kDefinitionNames, "definition");
-    v.EnumOpt("interaction", r.interaction, d.interaction, kInteractionNames, "interaction");
-    v.EnumOpt("material", r.material, d.material, kMatlNames, "material type");
+    v.Code("element", r.element, kHingeElementNames, "IDS_QM_CHOICE_ELEMENT");
+    v.EnumOpt("definition", r.definition, d.definition, kDefinitionNames,
+              "IDS_QM_CHOICE_DEFINITION");
+    v.EnumOpt("interaction", r.interaction, d.interaction, kInteractionNames,
+              "IDS_QM_CHOICE_INTERACTION");
+    v.EnumOpt("material", r.material, d.material, kMatlNames, "IDS_QM_CHOICE_MATERIAL");
     v.OptKeyRef("section", r.section, KindOf<T_SECT_D>());
     v.OptKeyRef("section_material", r.sectionMaterial, KindOf<T_MATL_D>());
     v.Opt("fibre_section", r.fibreSection, 0);

@@ -21,10 +21,10 @@ void CaseFields(V& v, T_FIELD_REF<V, T_BEAM_LOAD> r)
 {
     if constexpr (V::kReads) v.Must("type"); // before what depends on it
     v.Element("element", r.element);
-    v.EnumOpt("axes", r.axes, BEAM_LOAD_AXES::Local, kLoadAxesNames, "axes");
-    v.Enum("direction", r.direction, kLoadDirectionNames, "direction");
-    v.Enum("type", r.type, kBeamLoadNames, "type of beam load");
-    constexpr const char* range = "a position is between 0 and 1";
+    v.EnumOpt("axes", r.axes, BEAM_LOAD_AXES::Local, kLoadAxesNames, "IDS_QM_CHOICE_AXES");
+    v.Enum("direction", r.direction, kLoadDirectionNames, "IDS_QM_CHOICE_DIRECTION");
+    v.Enum("type", r.type, kBeamLoadNames, "IDS_QM_CHOICE_BEAM_LOAD");
+    constexpr const char* range = "IDS_QM_CASE_POSITION";
     const auto inside = [](double at) { return at >= 0.0 && at <= 1.0; };
     const T_DIM dim = kBeamLoadDims[static_cast<std::size_t>(r.type)];
     if (r.type != BEAM_LOAD_TYPE::Distributed) {
@@ -35,7 +35,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_BEAM_LOAD> r)
     v.NeedFixed("w", r.w, {dim, dim});
     v.OptFixed("at", r.at, {0.0, 1.0}, {});
     v.CheckEach("at", r.at, inside, range);
-    v.Check("at", r.at[0] < r.at[1], "the first position is before the second");
+    v.Check("at", r.at[0] < r.at[1], "IDS_QM_CASE_POSITIONS");
 }
 
 template <class V>
@@ -65,7 +65,7 @@ void LoadGroupField(V& v, T_FIELD_REF<V, int> group)
 {
     v.Opt("load_group", group, kLoadGroupRest);
     v.Check("load_group", group >= kLoadGroupDead && group <= kLoadGroupRest,
-            "a load group is 0, 1 or 2");
+            "IDS_QM_CASE_LOAD_GROUP");
 }
 
 template <class V>
@@ -127,27 +127,28 @@ template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_ULFC_D> r)
 {
     if constexpr (V::kReads) v.Must("type"); // before what depends on it
-    v.Enum("type", r.type, kUlfcTypeNames, "type of constraint");
+    v.Enum("type", r.type, kUlfcTypeNames, "IDS_QM_CHOICE_CONSTRAINT");
     v.Need("id", r.id);
     if (r.type == ULFC_TYPE::Truss)
-        v.EnumOpt("component", r.component, 0, ComponentNames(r.type), "component");
+        v.EnumOpt("component", r.component, 0, ComponentNames(r.type), "IDS_QM_CHOICE_COMPONENT");
     else
-        v.Enum("component", r.component, ComponentNames(r.type), "component");
-    if (r.type == ULFC_TYPE::Beam) v.Enum("position", r.position, kPositionNames, "position");
+        v.Enum("component", r.component, ComponentNames(r.type), "IDS_QM_CHOICE_COMPONENT");
+    if (r.type == ULFC_TYPE::Beam)
+        v.Enum("position", r.position, kPositionNames, "IDS_QM_CHOICE_POSITION");
 
     if constexpr (V::kReads) {
         const bool equal = v.Has("equal"), same = v.Has("same_as");
         r.inequality = v.Has("upper") | v.Has("lower");
         r.compareWithValue = !same;
         v.Rule(nullptr, int{equal} + int{same} + int{r.inequality} == 1,
-               "a constraint has either \"equal\" or \"same_as\" or bounds");
+               "IDS_QM_CASE_CONSTRAINT_EITHER");
     }
     if constexpr (V::kWrites) {
-        if (r.inequality && !r.upper && !r.lower) return v.Fail("the constraint has no bound");
+        if (r.inequality && !r.upper && !r.lower) return v.Fail("IDS_QM_CASE_CONSTRAINT_NO_BOUND");
     }
     v.OptRef("stage", r.stage, KindOf<T_STAG_D>());
     v.StageStep("step", r.step, kStageLastStep);
-    v.Check("step", r.stage != 0, "a step needs a stage");
+    v.Check("step", r.stage != 0, "IDS_QM_CASE_STEP_STAGE");
     const T_DIM dim = UlfcDim(r.type, r.component);
     if (r.inequality) {
         v.OptIf("upper", r.upper, dim);
@@ -170,8 +171,8 @@ template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_ULFI_D> r)
 {
     v.NeedRef("combination", r.combination, KindOf<T_LCOM_D>());
-    v.Enum("objective", r.objective, kObjectiveNames, "objective");
-    v.EnumOpt("sign", r.sign, 1, kSignNames, "sign");
+    v.Enum("objective", r.objective, kObjectiveNames, "IDS_QM_CHOICE_OBJECTIVE");
+    v.EnumOpt("sign", r.sign, 1, kSignNames, "IDS_QM_CHOICE_SIGN");
     v.Opt("solve_by_equations", r.solveByEquations, false);
     v.List("unknown", r.unknowns);
     v.NameRefs("constraints", r.constraints, KindOf<T_ULFC_D>());

@@ -11,7 +11,7 @@
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_POLC_PATTERN> r)
 {
-    v.Enum("kind", r.kind, kPatternNames, "pattern");
+    v.Enum("kind", r.kind, kPatternNames, "IDS_QM_CHOICE_PATTERN");
     if (r.kind == 0)
         v.KeyRef("number", r.number, KindOf<T_STLD_D>());
     else
@@ -23,7 +23,7 @@ template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_POLC_CONTROL> r)
 {
     static const T_POLC_CONTROL d;
-    v.Code("increment_method", r.incrementMethod, kIncrementNames, "increment method");
+    v.Code("increment_method", r.incrementMethod, kIncrementNames, "IDS_QM_CHOICE_INCREMENT");
     v.Opt("increment_option", r.incrementOption, d.incrementOption);
     v.Opt("increment_function", r.incrementFunction, d.incrementFunction);
     v.Opt("stiffness_ratio_limit", r.stiffnessRatioLimit, d.stiffnessRatioLimit);
@@ -38,9 +38,9 @@ template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_POLC_D> r)
 {
     v.Need("control_node", r.controlNode);
-    v.template Enum<1>("direction", r.direction, kDirectionNames, "direction");
+    v.template Enum<1>("direction", r.direction, kDirectionNames, "IDS_QM_CHOICE_DIRECTION");
     v.Group("pattern", [&](auto& pattern) {
-        pattern.Enum("kind", r.patternKind, kPatternNames, "pattern");
+        pattern.Enum("kind", r.patternKind, kPatternNames, "IDS_QM_CHOICE_PATTERN");
         pattern.Opt("modes", r.modes, {});
     });
     v.List("patterns", r.patterns);
@@ -53,9 +53,9 @@ void CaseFields(V& v, T_FIELD_REF<V, T_POVR_D> r)
 {
     const auto isStep = [](int step) { return step >= -2; };
     v.OptIf("EC8", r.ec8);
-    if (r.ec8) v.CheckEach("EC8", *r.ec8, isStep, "a step is -2 or above");
+    if (r.ec8) v.CheckEach("EC8", *r.ec8, isStep, "IDS_QM_CASE_LIMIT_STEP");
     v.OptIf("NTC", r.ntc);
-    if (r.ntc) v.CheckEach("NTC", *r.ntc, isStep, "a step is -2 or above");
+    if (r.ntc) v.CheckEach("NTC", *r.ntc, isStep, "IDS_QM_CASE_LIMIT_STEP");
 }
 
 // ---- spectra ------------------------------------------------------------------------------------
@@ -63,14 +63,14 @@ void CaseFields(V& v, T_FIELD_REF<V, T_POVR_D> r)
 template <class V>
 void CheckAbove(V& v, const char* key, double value)
 {
-    v.Check(key, value > 0.0, "the value must be above 0");
+    v.Check(key, value > 0.0, "IDS_QM_CASE_ABOVE_0");
 }
 
 template <class V>
 void DampingField(V& v, T_FIELD_REF<V, std::optional<double>> damping)
 {
     v.OptIf("damping", damping);
-    v.Check("damping", damping.value_or(0.0) >= 0.0, "damping can't be negative");
+    v.Check("damping", damping.value_or(0.0) >= 0.0, "IDS_QM_CASE_DAMPING");
 }
 
 template <class V>
@@ -93,8 +93,8 @@ template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_SPFC_EURO2003> r)
 {
     v.Need("type", r.type);
-    v.Check("type", r.type == 1 || r.type == 2, "the type is 1 or 2");
-    v.Letter("soil", r.soil, std::span(kSoils), "soil");
+    v.Check("type", r.type == 1 || r.type == 2, "IDS_QM_CASE_SPECTRUM_TYPE");
+    v.Letter("soil", r.soil, std::span(kSoils), "IDS_QM_CHOICE_SOIL");
     v.Need("ag", r.ag);
     CheckAbove(v, "ag", r.ag);
     DampingField(v, r.damping);
@@ -106,15 +106,15 @@ void CaseFields(V& v, T_FIELD_REF<V, T_SPFC_EURO2003> r)
     override("TB", r.TB);
     override("TC", r.TC);
     override("TD", r.TD);
-    v.Check("TC", AreOrdered(r.TB, r.TC), "TC is below TB");
-    v.Check("TD", AreOrdered(r.TB, r.TD), "TD is below TB");
-    v.Check("TD", AreOrdered(r.TC, r.TD), "TD is below TC");
+    v.Check("TC", AreOrdered(r.TB, r.TC), "IDS_QM_CASE_TC_BELOW_TB");
+    v.Check("TD", AreOrdered(r.TB, r.TD), "IDS_QM_CASE_TD_BELOW_TB");
+    v.Check("TD", AreOrdered(r.TC, r.TD), "IDS_QM_CASE_TD_BELOW_TC");
 }
 
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_SPFC_EURO1996> r)
 {
-    v.Letter("soil", r.soil, std::span(kSoils).first(3), "soil");
+    v.Letter("soil", r.soil, std::span(kSoils).first(3), "IDS_QM_CHOICE_SOIL");
     v.Need("ag", r.ag);
     CheckAbove(v, "ag", r.ag);
     DampingField(v, r.damping);
@@ -134,8 +134,8 @@ void CaseFields(V& v, T_FIELD_REF<V, T_SPFC_NTC_STATE> r)
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_SPFC_NTC> r)
 {
-    v.Letter("soil", r.soil, std::span(kSoils), "soil");
-    v.template Enum<1>("topography", r.topography, kTopographies, "topography");
+    v.Letter("soil", r.soil, std::span(kSoils), "IDS_QM_CHOICE_SOIL");
+    v.template Enum<1>("topography", r.topography, kTopographies, "IDS_QM_CHOICE_TOPOGRAPHY");
     DampingField(v, r.damping);
     v.NeedGroup("limit_states", [&](auto& states) {
         for (std::size_t i = 0; i < r.states.size(); ++i)
@@ -150,21 +150,21 @@ void CaseFields(V& v, T_FIELD_REF<V, T_SPFC_USER> r)
     double before = -1.0;
     const auto isAscending = [&](double T) { return T > std::exchange(before, T); };
     v.Need("T", r.T);
-    v.Check("T", r.T.size() >= 2, "a spectrum needs at least 2 points");
+    v.Check("T", r.T.size() >= 2, "IDS_QM_CASE_SPECTRUM_POINTS");
     v.Need("Sa", r.Sa);
     if (r.Sa.size() == r.T.size()) { // else the table of spectra says so
-        v.CheckEach("T", r.T, isNotNegative, "a period can't be negative");
-        v.CheckEach("T", r.T, isAscending, "periods must ascend");
-        v.CheckEach("Sa", r.Sa, isNotNegative, "Sa can't be negative");
+        v.CheckEach("T", r.T, isNotNegative, "IDS_QM_CASE_PERIOD_NEGATIVE");
+        v.CheckEach("T", r.T, isAscending, "IDS_QM_CASE_PERIODS_ASCEND");
+        v.CheckEach("Sa", r.Sa, isNotNegative, "IDS_QM_CASE_SA_NEGATIVE");
     }
     v.OptIf("gravity", r.gravity, kDimAccel);
-    v.Check("gravity", r.gravity.value_or(1.0) > 0.0, "gravity must be above 0");
+    v.Check("gravity", r.gravity.value_or(1.0) > 0.0, "IDS_QM_CASE_GRAVITY");
 }
 
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_SPFC_D> r)
 {
-    v.Variant("kind", r.data, kSpectrumKinds, "spectrum kind");
+    v.Variant("kind", r.data, kSpectrumKinds, "IDS_QM_CHOICE_SPECTRUM");
     std::visit([&](auto& data) { CaseFields(v, data); }, r.data);
 }
 
@@ -173,7 +173,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_SPFC_D> r)
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_EVAL_BILINEAR> r)
 {
-    v.WordIf("rule", r.rule, kBilinearRules, "bilinear rule");
+    v.WordIf("rule", r.rule, kBilinearRules, "IDS_QM_CHOICE_BILINEAR_RULE");
     v.OptIf("secant", r.secant);
     v.OptIf("drop", r.drop);
     v.OptIf("iterate", r.iterate);
@@ -183,11 +183,12 @@ template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_EVAL_D> r)
 {
     v.NameRef("push", r.push, KindOf<T_POLC_D>());
-    v.template Enum<kFirstMethod>("method", r.method, kMethodNames, "method");
+    v.template Enum<kFirstMethod>("method", r.method, kMethodNames, "IDS_QM_CHOICE_METHOD");
     const std::span<const char* const> offered = ProceduresOf(r.method);
-    v.Check("procedure", !offered.empty(), "only ATC-40 and FEMA440 have procedures");
+    v.Check("procedure", !offered.empty(), "IDS_QM_CASE_PROCEDURES");
     v.LetterIf("procedure", r.procedure,
-               offered.empty() ? std::span<const char* const>(kProcedures) : offered, "procedure");
+               offered.empty() ? std::span<const char* const>(kProcedures) : offered,
+               "IDS_QM_CHOICE_PROCEDURE");
     v.NameRef("spectrum", r.spectrum, KindOf<T_SPFC_D>());
     v.OptIf("behavior", r.behavior);
     v.OptIf("elastic_damping", r.elasticDamping);

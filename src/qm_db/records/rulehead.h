@@ -6,13 +6,13 @@
 #include <string_view>
 
 /// All of a rule but its condition. A window names the member as the record has it and takes the
-/// message of the catalogue; a case file names its own member and gives the reason.
+/// message of the catalogue; a case file names its own member and gives a reason of its own.
 struct T_RECORD_HEAD {
     using PLACE = T_RULE_PLACE;
     const char* message = "";      // catalogue key
     const char* field = "";        // member of the record, below the place's prefix
     const char* caseKey = nullptr; // member in a case file; null: not judged there
-    const char* reason = nullptr;  // what a case file's fault says
+    const char* reason = nullptr;  // what a case file's fault says, a catalogue key
 };
 
 template <class DATA>
@@ -23,7 +23,7 @@ inline T_FINDING FindingOf(const T_RECORD_HEAD& head, const T_RULE_PLACE& place)
     return FindingOf(T_RULE_HEAD{.message = head.message, .field = head.field}, place);
 }
 
-/// Why a member of a case file is refused; null: it keeps its rules.
+/// Why a member of a case file is refused, a catalogue key; null: it keeps its rules.
 template <class DATA>
 const char* FaultOf(std::span<const T_RECORD_RULE<DATA>> rows, const DATA& data,
                     std::string_view caseKey)

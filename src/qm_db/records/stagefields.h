@@ -24,7 +24,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_STAG_D> r)
     v.Part("activate", r.activate);
     v.Part("deactivate", r.deactivate);
     v.Opt("steps", r.steps, 1);
-    v.Check("steps", r.steps >= 1, "a stage has at least one step");
+    v.Check("steps", r.steps >= 1, "IDS_QM_CASE_STAGE_STEPS");
     v.Opt("duration", r.duration, 0.0);
     v.Check("duration", r.duration >= 0.0, kNotNegative);
 }
@@ -50,8 +50,8 @@ void CaseFields(V& v, T_FIELD_REF<V, T_ULSI_ROW> r, bool unknown)
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_ULSI_D> r)
 {
-    v.Enum("objective", r.objective, kObjectiveNames, "objective");
-    v.EnumOpt("sign", r.sign, 1, kSignNames, "sign");
+    v.Enum("objective", r.objective, kObjectiveNames, "IDS_QM_CHOICE_OBJECTIVE");
+    v.EnumOpt("sign", r.sign, 1, kSignNames, "IDS_QM_CHOICE_SIGN");
     v.Opt("solve_by_equations", r.solveByEquations, false);
     std::vector<T_ULSI_ROW> unknown, known;
     for (const T_ULSI_ROW& row : r.rows)

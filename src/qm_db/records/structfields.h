@@ -21,7 +21,7 @@ inline constexpr T_DIMS6 kDofForces{kDimForce,  kDimForce,  kDimForce,
 inline constexpr T_DIMS6 kDofSprings{kDimSpring, kDimSpring, kDimSpring,
                                      kDimMoment, kDimMoment, kDimMoment};
 
-inline constexpr const char* kNotNegative = "the value can't be negative";
+inline constexpr const char* kNotNegative = "IDS_QM_CASE_NOT_NEGATIVE";
 
 // ---- options of the model -----------------------------------------------------------------------
 
@@ -35,7 +35,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_DESIGN_CODES> r)
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_STCT_D> r)
 {
-    v.EnumOpt("birth", r.birth, STAGE_BIRTH::OnDeformed, kStageBirthNames, "birth of elements");
+    v.EnumOpt("birth", r.birth, STAGE_BIRTH::OnDeformed, kStageBirthNames, "IDS_QM_CHOICE_BIRTH");
     v.Opt("geometric_stiffness", r.geometricStiffness, false);
     v.Opt("cable_sag", r.cableSag, false);
 }
@@ -46,12 +46,12 @@ void HeadFields(V& v, T_FIELD_REF<V, T_STYP_D> r)
 {
     v.Opt("title", r.title, {});
     v.Group("units", [&](auto& units) {
-        units.Enum("force", r.units.force, kForceNames, "unit");
-        units.Enum("length", r.units.length, kLengthNames, "unit");
+        units.Enum("force", r.units.force, kForceNames, "IDS_QM_CHOICE_UNIT");
+        units.Enum("length", r.units.length, kLengthNames, "IDS_QM_CHOICE_UNIT");
     });
     v.OptIf("gravity", r.gravity, kDimAccel);
-    v.Check("gravity", r.gravity.value_or(1.0) > 0.0, "gravity must be above 0");
-    v.EnumIf("plane", r.plane, kPlaneNames, "plane");
+    v.Check("gravity", r.gravity.value_or(1.0) > 0.0, "IDS_QM_CASE_GRAVITY");
+    v.EnumIf("plane", r.plane, kPlaneNames, "IDS_QM_CHOICE_PLANE");
 }
 
 template <class V>
@@ -79,22 +79,22 @@ template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_NODE_D> r)
 {
     v.Need("id", r.id);
-    v.Check("id", r.id > 0, "a node id must be above 0");
+    v.Check("id", r.id > 0, "IDS_QM_CASE_NODE_ID");
     v.NeedFixed("xyz", r.xyz, kLengths3);
     v.StateFixed("mass", r.mass, kMasses3);
     v.CheckEach(
-        "mass", r.mass, [](double m) { return m >= 0.0; }, "a mass can't be negative");
+        "mass", r.mass, [](double m) { return m >= 0.0; }, "IDS_QM_CASE_MASS");
     v.State("restraint", r.restraint);
     v.CheckEach(
         "restraint", r.restraint, [](int flag) { return flag == 0 || flag == 1; },
-        "a restraint is 0 or 1");
+        "IDS_QM_CASE_RESTRAINT");
 }
 
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_STOR_D> r)
 {
     v.Need("height", r.height, kDimLength);
-    v.Check("height", r.height > 0.0, "a storey height must be above 0");
+    v.Check("height", r.height > 0.0, "IDS_QM_CASE_STOREY_HEIGHT");
     v.NodeList("nodes", r.nodes);
 }
 
@@ -103,7 +103,7 @@ template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_EIGV_D> r)
 {
     v.Need("period", r.period);
-    v.Check("period", r.period > 0.0, "a period must be above 0");
+    v.Check("period", r.period > 0.0, "IDS_QM_CASE_MODE_PERIOD");
     v.NodeTable("shape", r.shape);
     v.OptIf("participation", r.participation);
     v.OptIf("mass_percent", r.massPercent);
@@ -114,12 +114,12 @@ void CaseFields(V& v, T_FIELD_REF<V, T_EIGV_D> r)
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_MATL_D> r)
 {
-    v.EnumOpt("type", r.type, MATL_CLASS::Steel, kMatlNames, "material type");
+    v.EnumOpt("type", r.type, MATL_CLASS::Steel, kMatlNames, "IDS_QM_CHOICE_MATERIAL");
     v.Opt("E", r.E, 0.0, kDimStress);
     v.Check("E", r.E >= 0.0, kNotNegative);
     v.Opt("nu", r.nu, 0.0);
     v.OptIf("G", r.G, kDimStress);
-    v.Check("G", r.G.value_or(1.0) > 0.0, "a shear modulus must be above 0");
+    v.Check("G", r.G.value_or(1.0) > 0.0, "IDS_QM_CASE_SHEAR_MODULUS");
     v.Opt("density", r.density, 0.0, kDimDensity);
     v.Check("density", r.density >= 0.0, kNotNegative);
     v.Opt("alpha", r.alpha, 0.0);
@@ -151,7 +151,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_SECT_FACTORS> r)
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_SECT_D> r)
 {
-    v.EnumOpt("shape", r.shape, SECT_SHAPE::Value, kShapeNames, "shape");
+    v.EnumOpt("shape", r.shape, SECT_SHAPE::Value, kShapeNames, "IDS_QM_CHOICE_SHAPE");
     v.Padded("size", r.size, kDimLength);
     const auto property = [&](const char* key, const char* old, auto& value, T_DIM dim) {
         const char* const used = v.OptOr(key, old, value, 0.0, dim);
@@ -175,8 +175,8 @@ void CaseFields(V& v, T_FIELD_REF<V, T_SECT_D> r)
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_ENDS<T_DIRS6>> r)
 {
-    v.Flags("I", r.I, kReleaseNames, "release");
-    v.Flags("J", r.J, kReleaseNames, "release");
+    v.Flags("I", r.I, kReleaseNames, "IDS_QM_CHOICE_RELEASE");
+    v.Flags("J", r.J, kReleaseNames, "IDS_QM_CHOICE_RELEASE");
 }
 
 using T_END_OFFSETS = T_ENDS<std::array<double, 3>>;
@@ -193,10 +193,10 @@ template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_ELEM_D> r)
 {
     v.Need("id", r.id);
-    v.EnumOpt("kind", r.kind, ELEM_KIND::Beam, kElemKindNames, "kind");
+    v.EnumOpt("kind", r.kind, ELEM_KIND::Beam, kElemKindNames, "IDS_QM_CHOICE_KIND");
     const bool spring = r.kind == ELEM_KIND::Spring;
     v.NodePair("nodes", r.nodeI, r.nodeJ, spring ? 1 : 2,
-               spring ? "a spring has one node" : "an element has two nodes");
+               spring ? "IDS_QM_CASE_ONE_NODE" : "IDS_QM_CASE_TWO_NODES");
     if (spring || r.kind == ELEM_KIND::Link) {
         v.NeedFixed("stiffness", r.stiffness, kDofSprings);
         v.CheckEach(
@@ -217,15 +217,15 @@ template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_DIAP_D> r)
 {
     v.NodeList("nodes", r.nodes);
-    v.Rule("nodes", r.nodes.size() > 1, "at least two nodes are needed");
-    v.Enum("normal", r.normal, kAxisNames, "axis");
+    v.Rule("nodes", r.nodes.size() > 1, "IDS_QM_CASE_NODES_NEEDED");
+    v.Enum("normal", r.normal, kAxisNames, "IDS_QM_CHOICE_AXIS");
 }
 
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_EQDS_D> r)
 {
     v.NodeList("nodes", r.nodes);
-    v.Rule("nodes", r.nodes.size() > 1, "at least two nodes are needed");
-    v.Flags("directions", r.directions, kDirectionNames, "direction");
-    v.Rule("directions", r.directions != T_DIRS6{}, "at least one direction is needed");
+    v.Rule("nodes", r.nodes.size() > 1, "IDS_QM_CASE_NODES_NEEDED");
+    v.Flags("directions", r.directions, kDirectionNames, "IDS_QM_CHOICE_DIRECTION");
+    v.Rule("directions", r.directions != T_DIRS6{}, "IDS_QM_CASE_DIRECTION_NEEDED");
 }

@@ -17,7 +17,7 @@ struct T_RECORD_ROW {
     const char* store;  // table of the model file
     const char* member; // of the case file; null: it stands in another record
     CASE_KEY key;
-    std::string_view noun; // "there is no such ..."; empty: other records do not refer to it
+    std::string_view noun; // catalogue key; empty: other records do not refer to it
     /// As a record that refers to others: its place among the kinds in a message, and what it is
     /// called there; empty: it refers to none.
     int place = 0;
@@ -27,29 +27,32 @@ struct T_RECORD_ROW {
 // clang-format off
 /// In the order of the case file: a record refers to those of rows above, and of its own.
 inline constexpr std::tuple kRecords{
-    T_RECORD_ROW<T_NODE_D>{&T_MODEL::nodes, "nodes", "nodes", CASE_KEY::Member, "node"},
+    T_RECORD_ROW<T_NODE_D>{&T_MODEL::nodes, "nodes", "nodes", CASE_KEY::Member,
+                           "IDS_QM_NOUN_NODE"},
     T_RECORD_ROW<T_STOR_D>{&T_MODEL::storeys, "storeys", "storeys", CASE_KEY::Counted, "",
                            7, "IDS_QM_DB_USER_STOREY"},
     T_RECORD_ROW<T_EIGV_D>{&T_MODEL::modes, "modes", "modes", CASE_KEY::Counted, ""},
     T_RECORD_ROW<T_MATL_D>{&T_MODEL::materials, "materials", "materials",
-                           CASE_KEY::Stated, "material"},
+                           CASE_KEY::Stated, "IDS_QM_NOUN_MATERIAL"},
     T_RECORD_ROW<T_SECT_D>{&T_MODEL::sections, "sections", "sections",
-                           CASE_KEY::Stated, "section"},
+                           CASE_KEY::Stated, "IDS_QM_NOUN_SECTION"},
     T_RECORD_ROW<T_ELEM_D>{&T_MODEL::elements, "elements", "elements",
-                           CASE_KEY::Member, "element", 1, "IDS_QM_DB_USER_ELEMENT"},
+                           CASE_KEY::Member, "IDS_QM_NOUN_ELEMENT", 1, "IDS_QM_DB_USER_ELEMENT"},
     T_RECORD_ROW<T_DIAP_D>{&T_MODEL::diaphragms, "diaphragms", "diaphragms",
                            CASE_KEY::Stated, "", 2, "IDS_QM_DB_USER_DIAPHRAGM"},
     T_RECORD_ROW<T_EQDS_D>{&T_MODEL::equalDisplacements, "equal_displacements",
                            "equal_displacements", CASE_KEY::Stated, "",
                            3, "IDS_QM_DB_USER_EQUAL"},
     T_RECORD_ROW<T_STLD_D>{&T_MODEL::loadCases, "load_cases", "load_cases",
-                           CASE_KEY::Stated, "load case", 4, "IDS_QM_DB_USER_LOAD_CASE"},
+                           CASE_KEY::Stated, "IDS_QM_NOUN_LOAD_CASE",
+                           4, "IDS_QM_DB_USER_LOAD_CASE"},
     T_RECORD_ROW<T_LCOM_D>{&T_MODEL::combinations, "combinations", "combinations",
-                           CASE_KEY::Stated, "combination", 5, "IDS_QM_DB_USER_LCOM"},
-    T_RECORD_ROW<T_STAG_D>{&T_MODEL::stages, "stages", "stages", CASE_KEY::Stated, "stage",
-                           12, "IDS_QM_DB_USER_STAGE"},
+                           CASE_KEY::Stated, "IDS_QM_NOUN_COMBINATION", 5, "IDS_QM_DB_USER_LCOM"},
+    T_RECORD_ROW<T_STAG_D>{&T_MODEL::stages, "stages", "stages", CASE_KEY::Stated,
+                           "IDS_QM_NOUN_STAGE", 12, "IDS_QM_DB_USER_STAGE"},
     T_RECORD_ROW<T_ULFC_D>{&T_MODEL::ulfConstraints, "ulf_constraints", "ulf_constraints",
-                           CASE_KEY::Stated, "constraint", 11, "IDS_QM_DB_USER_ULF_CONSTRAINT"},
+                           CASE_KEY::Stated, "IDS_QM_NOUN_CONSTRAINT",
+                           11, "IDS_QM_DB_USER_ULF_CONSTRAINT"},
     T_RECORD_ROW<T_ULFI_D>{&T_MODEL::ulfItems, "ulf_items", "ulf_items",
                            CASE_KEY::Stated, "", 6, "IDS_QM_DB_USER_ULF_ITEM"},
     T_RECORD_ROW<T_ULSI_D>{&T_MODEL::ulfStageItems, "ulf_stage_items", "ulf_stage_items",
@@ -57,14 +60,17 @@ inline constexpr std::tuple kRecords{
     T_RECORD_ROW<T_POFC_D>{&T_MODEL::incrementFunctions, "increment_functions",
                            "increment_functions", CASE_KEY::Stated, ""},
     T_RECORD_ROW<T_PHGT_D>{&T_MODEL::hingeTypes, "hinge_types", "hinge_types",
-                           CASE_KEY::Stated, "hinge type", 9, "IDS_QM_DB_USER_HINGE_TYPE"},
+                           CASE_KEY::Stated, "IDS_QM_NOUN_HINGE_TYPE",
+                           9, "IDS_QM_DB_USER_HINGE_TYPE"},
     T_RECORD_ROW<T_PHGE_D>{&T_MODEL::hinges, "hinges", "hinges", CASE_KEY::Stated, "",
                            8, "IDS_QM_DB_USER_HINGE"},
     T_RECORD_ROW<T_IEHP_D>{&T_MODEL::inelasticHinges, "inelastic_hinges", "inelastic_hinges",
                            CASE_KEY::Stated, ""},
-    T_RECORD_ROW<T_SPFC_D>{&T_MODEL::spectra, "spectra", "spectra", CASE_KEY::Counted, "spectrum"},
+    T_RECORD_ROW<T_SPFC_D>{&T_MODEL::spectra, "spectra", "spectra", CASE_KEY::Counted,
+                           "IDS_QM_NOUN_SPECTRUM"},
     T_RECORD_ROW<T_POLC_D>{&T_MODEL::pushovers, "pushovers", "pushover",
-                           CASE_KEY::Counted, "pushover load case", 10, "IDS_QM_DB_USER_PUSHOVER"},
+                           CASE_KEY::Counted, "IDS_QM_NOUN_PUSHOVER",
+                           10, "IDS_QM_DB_USER_PUSHOVER"},
     T_RECORD_ROW<T_POVR_D>{&T_MODEL::poverSteps, "limit_state_steps", nullptr,
                            CASE_KEY::Counted, ""},
     T_RECORD_ROW<T_EVAL_D>{&T_MODEL::evaluations, "evaluations", "evaluations",

@@ -23,7 +23,7 @@ public:
     void Finish();
 
     CCasePut& Body() { return m_body; }
-    void Fail(const std::string& reason) { m_text.Fail(reason); }
+    void Fail(const char* reason) { m_text.Fail(reason); }
 
     template <class T>
     bool Cell(const char* key, const T& value)
