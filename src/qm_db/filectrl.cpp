@@ -1,11 +1,12 @@
 #include "qm_db/filectrl.h"
 
+#include "qm_base/say.h"
 #include "qm_base/textformat.h"
+#include "qm_db/file/storefault.h"
 
 #include <algorithm>
 #include <cerrno>
 #include <csignal>
-#include <cstring>
 #include <ctime>
 #include <fcntl.h>
 #include <filesystem>
@@ -13,6 +14,10 @@
 #include <unistd.h>
 
 namespace {
+
+constexpr const char* kCantOpen = "IDS_QM_FILE_CANT_OPEN";
+constexpr const char* kCantRead = "IDS_QM_FILE_CANT_READ";
+constexpr const char* kCantWrite = "IDS_QM_FILE_CANT_WRITE";
 
 /// An open file that is closed at the end of its scope.
 class CScopedDescriptor {
@@ -61,9 +66,10 @@ private:
     sigset_t m_before;
 };
 
-int Refuse(const std::string& path, const char* action, int code, T_FILE_ERROR& error)
+/// `key`: what can't be done, in the message catalogue.
+int Refuse(const std::string& path, const char* key, int code, T_FILE_ERROR& error)
 {
-    error = {FILE_FAULT::NoAccess, path + ": can't " + action + ": " + std::strerror(code)};
+    error = {FILE_FAULT::NoAccess, Say(key, path, SystemReason(code))};
     return 0;
 }
 
@@ -110,7 +116,7 @@ int WriteSpecial(const std::string& path, std::string_view text, T_FILE_ERROR& e
 {
     CScopedDescriptor file(open(path.c_str(), O_WRONLY | O_CLOEXEC));
     if (file.Get() < 0 || !WriteAll(file.Get(), text) || !file.Close())
-        return Refuse(path, "write", errno, error);
+        return Refuse(path, kCantWrite, errno, error);
     return 1;
 }
 
@@ -127,9 +133,9 @@ int CFileCtrl::WriteWholeFile(const std::string& path, std::string_view text, T_
     const std::string target = TargetOf(path);
     struct stat old {};
     const bool exists = stat(target.c_str(), &old) == 0;
-    if (exists && S_ISDIR(old.st_mode)) return Refuse(path, "write", EISDIR, error);
+    if (exists && S_ISDIR(old.st_mode)) return Refuse(path, kCantWrite, EISDIR, error);
     if (exists && !S_ISREG(old.st_mode)) return WriteSpecial(target, text, error);
-    if (exists && access(target.c_str(), W_OK) != 0) return Refuse(path, "write", errno, error);
+    if (exists && access(target.c_str(), W_OK) != 0) return Refuse(path, kCantWrite, errno, error);
 
     const std::string temporary = target + FormatText(".tmp-%ld", static_cast<long>(getpid()));
     unlink(temporary.c_str()); // left by a dead process of the same number
@@ -137,7 +143,7 @@ int CFileCtrl::WriteWholeFile(const std::string& path, std::string_view text, T_
         rename(temporary.c_str(), target.c_str()) != 0) {
         const int code = errno;
         unlink(temporary.c_str());
-        return Refuse(path, "write", code, error);
+        return Refuse(path, kCantWrite, code, error);
     }
     SyncFolder(target);
     return 1;
@@ -146,9 +152,9 @@ int CFileCtrl::WriteWholeFile(const std::string& path, std::string_view text, T_
 int CFileCtrl::ReadWholeFile(const std::string& path, std::string& text, T_FILE_ERROR& error)
 {
     const CScopedDescriptor file(open(path.c_str(), O_RDONLY | O_CLOEXEC));
-    if (file.Get() < 0) return Refuse(path, "open", errno, error);
+    if (file.Get() < 0) return Refuse(path, kCantOpen, errno, error);
     struct stat info {};
-    if (fstat(file.Get(), &info) != 0) return Refuse(path, "read", errno, error);
+    if (fstat(file.Get(), &info) != 0) return Refuse(path, kCantRead, errno, error);
 
     std::string whole;
     std::size_t used = 0;
@@ -158,7 +164,7 @@ int CFileCtrl::ReadWholeFile(const std::string& path, std::string& text, T_FILE_
         if (used == whole.size()) whole.resize(2 * whole.size());
         const ssize_t count = read(file.Get(), whole.data() + used, whole.size() - used);
         if (count < 0 && errno == EINTR) continue;
-        if (count < 0) return Refuse(path, "read", errno, error);
+        if (count < 0) return Refuse(path, kCantRead, errno, error);
         if (count == 0) break;
         used += static_cast<std::size_t>(count);
     }

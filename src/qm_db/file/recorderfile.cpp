@@ -1,5 +1,6 @@
 #include "qm_db/file/recorderfile.h"
 
+#include "qm_base/say.h"
 #include "qm_base/textformat.h"
 #include "qm_db/file/jsonplace.h"
 #include "qm_db/filectrl.h"
@@ -119,8 +120,8 @@ std::size_t CRecorderFile::CellCount(std::size_t row) const
 T_FILE_ERROR CRecorderFile::ErrorAt(std::size_t row, std::size_t column,
                                     const std::string& reason) const
 {
-    return {FILE_FAULT::BadInput,
-            m_name + FormatText(": line %d, column %zu: ", m_rowLine[row], column + 1) + reason};
+    return {FILE_FAULT::BadInput, Say("IDS_QM_RECORDER_AT", m_name, std::to_string(m_rowLine[row]),
+                                      std::to_string(column + 1), reason)};
 }
 
 int CRecorderFile::FindColumn(const std::string& name, int& column, T_FILE_ERROR& error) const
@@ -129,10 +130,10 @@ int CRecorderFile::FindColumn(const std::string& name, int& column, T_FILE_ERROR
     const bool twice =
         it != m_header.end() && std::find(it + 1, m_header.end(), name) != m_header.end();
     if (it == m_header.end() || twice) {
-        const std::string reason = m_header.empty() ? "no header line with the column "
-                                   : twice          ? "two columns have the name "
-                                                    : "the header has no column ";
-        error = {FILE_FAULT::BadInput, m_name + ": " + reason + QuotedText(name)};
+        const char* const reason = m_header.empty() ? "IDS_QM_RECORDER_NO_HEADER"
+                                   : twice          ? "IDS_QM_RECORDER_TWO_COLUMNS"
+                                                    : "IDS_QM_RECORDER_NO_COLUMN";
+        error = {FILE_FAULT::BadInput, Say(reason, m_name, QuotedText(name))};
         return 0;
     }
     column = static_cast<int>(it - m_header.begin()) + 1;
@@ -146,13 +147,13 @@ int CRecorderFile::AddColumn(int column, std::vector<double>& sum, T_FILE_ERROR&
     for (std::size_t row = 0; row < RowCount(); ++row) {
         const std::size_t count = CellCount(row);
         if (index >= count) {
-            error = ErrorAt(row, index, FormatText("missing, the row has %zu columns", count));
+            error = ErrorAt(row, index, Say("IDS_QM_RECORDER_SHORT_ROW", std::to_string(count)));
             return 0;
         }
         const double value = m_cells[m_rowStart[row] + index];
         if (std::isnan(value)) {
-            error =
-                ErrorAt(row, index, QuotedText(m_badCells.at(index)) + " is not a finite number");
+            error = ErrorAt(row, index,
+                            Say("IDS_QM_RECORDER_NOT_FINITE", QuotedText(m_badCells.at(index))));
             return 0;
         }
         total[row] += value;

@@ -28,5 +28,7 @@ private:
 
 /// BadInput: "<file> is damaged: <what>".
 [[noreturn]] void ThrowDamaged(const std::string& what);
+/// What the system's error number says.
+std::string SystemReason(int errorNumber);
 /// NoAccess with the text of the system's error number as the detail.
 [[noreturn]] void ThrowSystem(const char* key, int errorNumber);
