@@ -1,5 +1,7 @@
 #include "qm_db/analysisworker.h"
 
+#include "qm_base/say.h"
+
 #include <chrono>
 #include <exception>
 
@@ -23,10 +25,10 @@ bool CAnalysisWorker::Tell(std::size_t done, std::size_t total)
 
 void CAnalysisWorker::Run()
 {
-    const auto fail = [&](const char* reason) {
+    const auto fail = [&](const std::string& reason) {
         m_error = {};
         m_error.fault = ANALYSIS_FAULT::Failed;
-        m_error.text = std::string("the analysis failed: ") + reason;
+        m_error.text = Say("IDS_QM_ANALYSIS_FAILED", reason);
     };
     try {
         m_hasResults =
@@ -35,7 +37,7 @@ void CAnalysisWorker::Run()
     } catch (const std::exception& fault) {
         fail(fault.what());
     } catch (...) {
-        fail("unknown reason");
+        fail(Say("IDS_QM_ANALYSIS_UNKNOWN"));
     }
     const std::lock_guard<std::mutex> lock(m_mutex);
     m_isDone = true;

@@ -1,5 +1,6 @@
 #include "qm_db/dbdoc.h"
 
+#include "qm_base/say.h"
 #include "qm_db/casefile.h"
 
 #include <algorithm>
@@ -122,7 +123,7 @@ int CDBDoc::SaveAs(const std::string& path, T_FILE_ERROR& error)
 int CDBDoc::StartAnalysis(T_ANALYSIS_OPTIONS options, T_ANALYSIS_ERROR& error)
 {
     if (m_worker) {
-        error = Failure(ANALYSIS_FAULT::Failed, "an analysis of this model is running already");
+        error = Failure(ANALYSIS_FAULT::Failed, Say("IDS_QM_ANALYSIS_RUNNING"));
         return 0;
     }
     error = {};
@@ -172,11 +173,11 @@ void CDBDoc::EndAnalysis()
     T_ANALYSIS_RESULTS results;
     const int done = worker->Finish(results, m_outcome);
     if (worker->IsCancelled())
-        m_outcome = Failure(ANALYSIS_FAULT::Cancelled, "cancelled");
+        m_outcome = Failure(ANALYSIS_FAULT::Cancelled, Say("IDS_QM_ENGINE_CANCELLED"));
     else if (done && m_data.Revision() != m_revisionAtStart)
-        m_outcome = Failure(ANALYSIS_FAULT::Failed, "the model was changed during the analysis");
+        m_outcome = Failure(ANALYSIS_FAULT::Failed, Say("IDS_QM_ANALYSIS_CHANGED"));
     else if (done && !CAnalysisRun(*this).Keep(std::move(results)))
-        m_outcome = Failure(ANALYSIS_FAULT::Failed, "the modes could not be changed");
+        m_outcome = Failure(ANALYSIS_FAULT::Failed, Say("IDS_QM_ANALYSIS_MODES"));
 }
 
 void CDBDoc::AbandonAnalysis()

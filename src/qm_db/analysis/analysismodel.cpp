@@ -1,8 +1,6 @@
 #include "qm_db/analysis/analysismodel.h"
 
-#include "qm_base/msgfunction.h"
-#include "qm_base/textformat.h"
-#include "qm_db/records/structnames.h"
+#include "qm_base/say.h"
 #include "qm_db/sectionproperties.h"
 
 #include <algorithm>
@@ -59,7 +57,19 @@ int Refuse(T_ANALYSIS_ERROR error, std::string text, T_ANALYSIS_ERROR& out)
 
 std::string ElementText(const T_ELEM_D& e)
 {
-    return FormatText("%s %d", kElemKindNames[static_cast<std::size_t>(e.kind)], e.id);
+    constexpr const char* kKinds[] = {"IDS_QM_ANALYSIS_BEAM", "IDS_QM_ANALYSIS_TRUSS",
+                                      "IDS_QM_ANALYSIS_LINK", "IDS_QM_ANALYSIS_SPRING"};
+    return Say(kKinds[static_cast<std::size_t>(e.kind)], std::to_string(e.id));
+}
+
+std::string CaseText(const T_STLD_D& record)
+{
+    return Say("IDS_QM_ANALYSIS_CASE", record.name);
+}
+
+std::string NoNode(int id)
+{
+    return Say("IDS_QM_ANALYSIS_NO_NODE", std::to_string(id));
 }
 
 solver::T_NODE NodeOf(const T_NODE_D& record, const solver::T_DIRS6& outOfPlane)
@@ -92,8 +102,7 @@ std::string SectionFault(const T_SECT_D& record)
     T_SECT_D ignored;
     SECT_FAULT fault{};
     if (CSectionProperties::Calc(record, ignored, fault)) return {};
-    return "section \"" + record.name +
-           "\": " + zql::lib::MMSGFunction::GetValue(MessageKeyOf(fault));
+    return Say("IDS_QM_ANALYSIS_SECTION", record.name, Say(MessageKeyOf(fault)));
 }
 
 std::vector<std::size_t> IndicesOf(const std::vector<int>& all, const std::vector<int>& ids)
@@ -155,15 +164,15 @@ int CAnalysisModel::AddElement(const T_ELEM_D& e, T_ANALYSIS_ERROR& error)
     const long i = IndexOf(m_nodes, e.nodeI), j = spring ? i : IndexOf(m_nodes, e.nodeJ);
     if (i == kAbsent || j == kAbsent) {
         const int node = i == kAbsent ? e.nodeI : e.nodeJ;
-        return FailElement(e, FormatText("there is no node %d", node), error);
+        return FailElement(e, NoNode(node), error);
     }
     out.i = static_cast<std::size_t>(i);
     out.j = static_cast<std::size_t>(j);
     if (e.kind == ELEM_KIND::Beam || e.kind == ELEM_KIND::Truss) {
         const long material = IndexOf(m_materials, e.material);
         const long section = IndexOf(m_sections, e.section);
-        if (material == kAbsent) return FailElement(e, "the material is missing", error);
-        if (section == kAbsent) return FailElement(e, "the section is missing", error);
+        if (material == kAbsent) return FailElement(e, Say("IDS_QM_ENGINE_NO_MATERIAL"), error);
+        if (section == kAbsent) return FailElement(e, Say("IDS_QM_ENGINE_NO_SECTION"), error);
         const std::string fault = SectionFault(m_model.sections.at(e.section));
         if (!fault.empty()) return FailElement(e, fault, error);
         out.material = static_cast<std::size_t>(material);
@@ -201,17 +210,16 @@ int CAnalysisModel::BuildFrame(T_ANALYSIS_ERROR& error)
             T_ANALYSIS_ERROR place;
             place.node = id;
             if (IndexOf(m_nodes, id) == kAbsent)
-                return Refuse(place, FormatText("%s %d: there is no node %d", what, key, id),
-                              error);
+                return Refuse(place, Say(what, std::to_string(key)) + ": " + NoNode(id), error);
         }
         return 1;
     };
     for (const auto& [key, d] : m_model.diaphragms) {
-        if (!known(d.nodes, "diaphragm", key)) return 0;
+        if (!known(d.nodes, "IDS_QM_DB_USER_DIAPHRAGM", key)) return 0;
         m_frame.diaphragms.push_back({IndicesOf(m_nodes, d.nodes), d.normal});
     }
     for (const auto& [key, e] : m_model.equalDisplacements) {
-        if (!known(e.nodes, "equal displacements", key)) return 0;
+        if (!known(e.nodes, "IDS_QM_DB_USER_EQUAL", key)) return 0;
         m_frame.equalDisplacements.push_back({IndicesOf(m_nodes, e.nodes), e.directions});
     }
     return 1;
@@ -226,10 +234,7 @@ int CAnalysisModel::AddNodeLoads(const T_STLD_D& record, const std::vector<L>& f
         if (index == kAbsent) {
             T_ANALYSIS_ERROR place;
             place.node = load.node;
-            return Refuse(
-                place,
-                FormatText("load case \"%s\": there is no node %d", record.name.c_str(), load.node),
-                error);
+            return Refuse(place, CaseText(record) + ": " + NoNode(load.node), error);
         }
         to.push_back(LoadOf(load));
         to.back().node = static_cast<std::size_t>(index);
@@ -246,9 +251,8 @@ int CAnalysisModel::AddElementLoads(const T_STLD_D& record, const std::vector<L>
         if (index == kAbsent) {
             T_ANALYSIS_ERROR place;
             place.element = load.element;
-            return Refuse(place,
-                          FormatText("load case \"%s\": there is no element %d",
-                                     record.name.c_str(), load.element),
+            const std::string id = std::to_string(load.element);
+            return Refuse(place, CaseText(record) + ": " + Say("IDS_QM_ANALYSIS_NO_ELEMENT", id),
                           error);
         }
         to.push_back(LoadOf(load));
@@ -263,7 +267,7 @@ int CAnalysisModel::BuildCase(int key, solver::T_LOAD_CASE& out, T_ANALYSIS_ERRO
     T_ANALYSIS_ERROR place;
     place.loadCase = key;
     if (it == m_model.loadCases.end())
-        return Refuse(place, FormatText("there is no load case %d", key), error);
+        return Refuse(place, Say("IDS_QM_ANALYSIS_NO_CASE", std::to_string(key)), error);
     const T_STLD_D& record = it->second;
     solver::T_LOAD_CASE loads;
     loads.selfWeight = record.selfWeight;
@@ -309,7 +313,7 @@ T_ANALYSIS_ERROR CAnalysisModel::ErrorOf(const solver::T_SOLVER_ERROR& error,
     };
     if (error.loadCase >= 0 && static_cast<std::size_t>(error.loadCase) < cases.size()) {
         out.loadCase = cases[static_cast<std::size_t>(error.loadCase)];
-        add("load case \"" + m_model.loadCases.at(out.loadCase).name + '"');
+        add(CaseText(m_model.loadCases.at(out.loadCase)));
     }
     if (error.element >= 0) {
         out.element = m_elements[static_cast<std::size_t>(error.element)];
@@ -317,9 +321,9 @@ T_ANALYSIS_ERROR CAnalysisModel::ErrorOf(const solver::T_SOLVER_ERROR& error,
     }
     if (error.node >= 0) {
         out.node = m_nodes[static_cast<std::size_t>(error.node)];
-        add(out.part.size() > 1
-                ? FormatText("part of %zu nodes at node %d", out.part.size(), out.node)
-                : FormatText("node %d", out.node));
+        const std::string node = std::to_string(out.node);
+        add(out.part.size() > 1 ? Say("IDS_QM_ANALYSIS_PART", std::to_string(out.part.size()), node)
+                                : Say("IDS_QM_ANALYSIS_NODE", node));
     }
     out.text += (out.text.empty() ? "" : ": ") + error.reason.Text();
     return out;

@@ -1,6 +1,6 @@
 #include "qm_db/analysis/stagedanalysis.h"
 
-#include "qm_base/textformat.h"
+#include "qm_base/say.h"
 #include "qm_db/results/fingerprint.h"
 
 #include <algorithm>
@@ -124,7 +124,8 @@ int CStagedAnalysis::InStage(int key, T_ANALYSIS_ERROR& error) const
 {
     error.stage = key;
     const bool more = error.node != 0 || error.element != 0 || error.loadCase != 0;
-    error.text = "stage \"" + m_model.stages.at(key).name + (more ? "\", " : "\": ") + error.text;
+    error.text = Say("IDS_QM_ANALYSIS_STAGE", m_model.stages.at(key).name) + (more ? ", " : ": ") +
+                 error.text;
     return 0;
 }
 
@@ -142,7 +143,7 @@ int CStagedAnalysis::AddElements(const std::vector<int>& ids, std::vector<std::s
         if (out.back() < m_frame.ElementIds().size()) continue;
         error.fault = ANALYSIS_FAULT::BadModel;
         error.element = id;
-        error.text = FormatText("there is no element %d", id);
+        error.text = Say("IDS_QM_ANALYSIS_NO_ELEMENT", std::to_string(id));
         return 0;
     }
     return 1;
@@ -164,9 +165,9 @@ int CStagedAnalysis::AddSupport(int node, std::vector<solver::T_STAGE_SUPPORT>& 
     if (any) return 1;
     error.fault = ANALYSIS_FAULT::BadModel;
     error.node = node;
-    error.text = FormatText(record == m_model.nodes.end() ? "there is no node %d"
-                                                          : "node %d: it has no restraint",
-                            node);
+    error.text = Say(record == m_model.nodes.end() ? "IDS_QM_ANALYSIS_NO_NODE"
+                                                   : "IDS_QM_ANALYSIS_NO_RESTRAINT",
+                     std::to_string(node));
     return 0;
 }
 
