@@ -1,23 +1,29 @@
 // Commands that print hinge types and load cases.
 #include "hingetools.h"
-#include "qm_base/msgfunction.h"
+#include "qm_base/say.h"
 #include "qm_base/textformat.h"
 #include "qm_db/recordrules.h"
-#include "qm_db/records/hingenames.h"
 #include "qm_rps/hinge/hingegenerator.h"
 #include "qm_rps/hinge/hingetypefindings.h"
 #include "qm_rps/po_hingetypelistdlg.h"
 
 namespace {
 
+// In the order of SKEL_TYPE.
+constexpr const char* kCurveTypes[] = {
+    "IDS_QM_CLI_HINGE_BILINEAR",      "IDS_QM_CLI_HINGE_TRILINEAR",
+    "IDS_QM_CLI_HINGE_SLIP_BILINEAR", "IDS_QM_CLI_HINGE_SLIP_TRILINEAR",
+    "IDS_QM_CLI_HINGE_FEMA",          "IDS_QM_CLI_HINGE_EC8",
+    "IDS_QM_CLI_HINGE_COMPRESSION"};
+
 std::string Where(const T_FINDING& f)
 {
     std::string text;
     if (f.part >= 0) {
         text += std::string(kComponentNames[static_cast<std::size_t>(f.part)]) + ", ";
-        text += std::string(EndName(EndOf(f))) + ", ";
+        text += EndName(EndOf(f)) + ", ";
     }
-    if (!f.point.empty()) text += "point " + f.point + ", ";
+    if (!f.point.empty()) text += Say("IDS_QM_CLI_HINGE_POINT", f.point) + ", ";
     return text + f.field;
 }
 
@@ -26,26 +32,29 @@ std::string Text(const T_SKEL_POINT& p)
     return "(" + ShortestText(p.deform) + ", " + ShortestText(p.strength) + ")";
 }
 
+/// What stands below an end of a component.
+void PrintDetail(const std::string& text)
+{
+    std::printf("      %s\n", text.c_str());
+}
+
 void PrintSide(const char* name, const T_SKEL_SIDE& s)
 {
-    std::printf("      %s yield %s, Dy %s; B %s C %s D %s E %s; IO %s, LS %s, CP %s\n", name,
-                ShortestText(s.yield).c_str(), ShortestText(s.yieldDeform).c_str(),
-                Text(s.B).c_str(), Text(s.C).c_str(), Text(s.D).c_str(), Text(s.E).c_str(),
-                ShortestText(s.IO).c_str(), ShortestText(s.LS).c_str(), ShortestText(s.CP).c_str());
+    PrintDetail(Say("IDS_QM_CLI_HINGE_SIDE", name, ShortestText(s.yield),
+                    ShortestText(s.yieldDeform), Text(s.B), Text(s.C), Text(s.D), Text(s.E),
+                    ShortestText(s.IO), ShortestText(s.LS), ShortestText(s.CP)));
 }
 
 void PrintSide(const char* name, const T_SKEL_MULTI_SIDE& s)
 {
-    std::printf("      %s P %s, %s, %s; D %s, %s, %s; alpha %s, %s; gap %s\n", name,
-                ShortestText(s.P1).c_str(), ShortestText(s.P2).c_str(), ShortestText(s.P3).c_str(),
-                ShortestText(s.D1).c_str(), ShortestText(s.D2).c_str(), ShortestText(s.D3).c_str(),
-                ShortestText(s.alpha1).c_str(), ShortestText(s.alpha2).c_str(),
-                ShortestText(s.gap).c_str());
+    PrintDetail(Say("IDS_QM_CLI_HINGE_MULTI_SIDE", name, ShortestText(s.P1), ShortestText(s.P2),
+                    ShortestText(s.P3), ShortestText(s.D1), ShortestText(s.D2), ShortestText(s.D3),
+                    ShortestText(s.alpha1), ShortestText(s.alpha2), ShortestText(s.gap)));
 }
 
 void PrintCurve(HINGE_END end, const T_SKEL_CURVE& curve)
 {
-    std::printf("    %s:\n", EndName(end));
+    std::printf("    %s:\n", EndName(end).c_str());
     std::visit(
         [](const auto& c) {
             PrintSide("(+)", c.sides.pos);
@@ -54,14 +63,13 @@ void PrintCurve(HINGE_END end, const T_SKEL_CURVE& curve)
         curve);
     const auto* fema = std::get_if<T_SKEL_FEMA>(&curve);
     if (!fema) return;
-    std::printf("      measure: %s, strength loss %s\n",
-                fema->measure == SKEL_MEASURE::DDy ? "D/Dy" : "plastic",
-                fema->strengthLoss ? "on" : "off");
+    const bool byDy = fema->measure == SKEL_MEASURE::DDy;
+    PrintDetail(Say("IDS_QM_CLI_HINGE_MEASURE", byDy ? "D/Dy" : Say("IDS_QM_CLI_HINGE_PLASTIC"),
+                    Say(fema->strengthLoss ? "IDS_QM_CLI_HINGE_ON" : "IDS_QM_CLI_HINGE_OFF")));
     if (!fema->compliance)
-        std::printf("      acceptance criteria: %s\n",
-                    zql::lib::MMSGFunction::GetValue("IDS_RPS_PO_FEMA_Inactive").c_str());
+        PrintDetail(Say("IDS_QM_CLI_HINGE_CRITERIA", Say("IDS_RPS_PO_FEMA_Inactive")));
     for (const T_SKEL_AXIAL& axial : fema->curves)
-        std::printf("      curve at axial force %s\n", ShortestText(axial.axial).c_str());
+        PrintDetail(Say("IDS_QM_CLI_HINGE_AXIAL_CURVE", ShortestText(axial.axial)));
 }
 
 } // namespace
@@ -71,10 +79,9 @@ EXIT_CODE RunHingeList(const T_HINGE_OPTIONS& o)
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     return ForEachType(doc, o.type, [&](int key, const T_PHGT_D& type) {
-        std::printf("%s: %s, used by %zu elements\n",
-                    CPO_HingeTypeListDlg::NameOf(key, type.name).c_str(),
-                    CPO_HingeTypeListDlg::DataToStr(type.element).c_str(),
-                    doc.Attr().GetElemsByPhgt(key).size());
+        PrintLine(Say("IDS_QM_CLI_HINGE_USED", CPO_HingeTypeListDlg::NameOf(key, type.name),
+                      CPO_HingeTypeListDlg::DataToStr(type.element),
+                      std::to_string(doc.Attr().GetElemsByPhgt(key).size())));
     });
 }
 
@@ -92,7 +99,7 @@ EXIT_CODE RunHingeShow(const T_HINGE_OPTIONS& o)
             T_HINGE_COMPONENT& component = type.components[c];
             if (!component.active) continue;
             std::printf("  %s: %s\n", kComponentNames[c],
-                        kSkelNames[static_cast<std::size_t>(component.type)]);
+                        Say(kCurveTypes[static_cast<std::size_t>(component.type)]).c_str());
             ForEachPage(component, PrintCurve);
         }
     });
@@ -107,20 +114,20 @@ EXIT_CODE RunHingeCheck(const T_HINGE_OPTIONS& o)
     std::size_t findings = 0, types = 0, warnings = 0;
     const EXIT_CODE code = ForEachType(doc, o.type, [&](int key, const T_PHGT_D& type) {
         ++types;
-        const auto print = [&](const char* what, const std::vector<T_FINDING>& found) {
+        const auto print = [&](const char* line, const std::vector<T_FINDING>& found) {
             for (const T_FINDING& f : found)
-                std::printf("%s: %s%s: %s: %s\n",
-                            CPO_HingeTypeListDlg::NameOf(key, type.name).c_str(), what,
-                            Where(f).c_str(), f.ruleText.c_str(), f.text.c_str());
+                PrintLine(Say(line, CPO_HingeTypeListDlg::NameOf(key, type.name), Where(f),
+                              f.ruleText, f.text));
             return found.size();
         };
-        findings += print("", HingeTypeFindings(type, context));
-        findings += print("", generator.ElementFindings(key));
-        warnings += print("warning: ", HingeTypeWarnings(type));
+        constexpr const char* kFinding = "IDS_QM_CLI_HINGE_FINDING";
+        findings += print(kFinding, HingeTypeFindings(type, context));
+        findings += print(kFinding, generator.ElementFindings(key));
+        warnings += print("IDS_QM_CLI_HINGE_WARNING", HingeTypeWarnings(type));
     });
     if (code != EXIT_CODE::Done) return code;
-    std::printf("%zu hinge types, %zu findings\n", types, findings);
-    if (warnings > 0) std::printf("%zu warnings\n", warnings);
+    PrintLine(Say("IDS_QM_CLI_HINGE_FINDINGS", std::to_string(types), std::to_string(findings)));
+    if (warnings > 0) PrintLine(Say("IDS_QM_CLI_HINGE_WARNINGS", std::to_string(warnings)));
     return findings == 0 ? EXIT_CODE::Done : EXIT_CODE::NotFound;
 }
 
@@ -139,6 +146,7 @@ EXIT_CODE RunCaseCheck(const std::string& file)
             std::printf("%s: %s: %s\n", polc.name.c_str(), f.field.c_str(), f.text.c_str());
         findings += all.size();
     }
-    std::printf("%zu load cases, %zu findings\n", doc.Data().Model().pushovers.size(), findings);
+    PrintLine(Say("IDS_QM_CLI_HINGE_CASE_FINDINGS",
+                  std::to_string(doc.Data().Model().pushovers.size()), std::to_string(findings)));
     return findings == 0 ? EXIT_CODE::Done : EXIT_CODE::NotFound;
 }

@@ -1,6 +1,6 @@
 // Commands that edit or draw a hinge type.
 #include "hingetools.h"
-#include "qm_base/msgfunction.h"
+#include "qm_base/say.h"
 #include "qm_rps/hinge/hingemirror.h"
 #include "qm_rps/hinge/sectionstrength.h"
 #include "qm_rps/po_hingeskcvtabfemaaxialgrid.h"
@@ -21,7 +21,7 @@ EXIT_CODE StoreType(CDBDoc& doc, int key, T_PHGT_D& type, const std::string& out
     for (T_HINGE_COMPONENT& component : type.components)
         component = MirroredComponent(component);
     if (!doc.Edit().Begin("hinge type") || !doc.Edit().Put(key, type) || !doc.Edit().Commit())
-        return Complain(EXIT_CODE::BadInput, doc.Path() + ": the hinge type can't be stored");
+        return Complain(EXIT_CODE::BadInput, Say("IDS_QM_CLI_HINGE_NOT_STORED", doc.Path()));
     return SaveDocument(doc, out);
 }
 
@@ -62,13 +62,10 @@ EXIT_CODE RunHingeConvert(const T_HINGE_OPTIONS& o)
         });
     }
     if (switched == 0 && !noYield)
-        return Complain(EXIT_CODE::Usage,
-                        o.file + ": hinge type \"" + o.type + "\" has no curve to switch");
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_NO_SWITCH", o.file, o.type));
     if (noYield)
-        return Complain(EXIT_CODE::Usage, o.file + ": hinge type \"" + o.type +
-                                              "\": a curve has no yield deformation; enter "
-                                              "yield_deform first (see qm-rps hinge yield)");
-    std::printf("%d curves switched\n", switched);
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_NO_YIELD_DEFORM", o.file, o.type));
+    PrintLine(Say("IDS_QM_CLI_HINGE_SWITCHED", std::to_string(switched)));
     return StoreType(doc, key, type, o.out);
 }
 
@@ -84,7 +81,7 @@ EXIT_CODE RunHingeAxial(const T_HINGE_OPTIONS& o)
         component ? PageOf(type.components[static_cast<std::size_t>(*component)], o.end, page)
                   : nullptr;
     auto* fema = curve ? std::get_if<T_SKEL_FEMA>(curve) : nullptr;
-    if (!fema) return Complain(EXIT_CODE::Usage, o.file + ": that component has no FEMA curve");
+    if (!fema) return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_NO_FEMA", o.file));
     CPO_HingeSkcvTabFemaAxialGrid grid;
     grid.Data2Dlg(fema->curves);
     bool ok = true;
@@ -97,9 +94,8 @@ EXIT_CODE RunHingeAxial(const T_HINGE_OPTIONS& o)
     grid.Dlg2Data(fema->curves, fema->sides);
     fema->multiCurve = !fema->curves.empty();
     if (fema->curves.size() == 1)
-        return Complain(EXIT_CODE::Usage,
-                        zql::lib::MMSGFunction::GetValue("IDS_RPS_MULTI_CURVE_COUNT"));
-    std::printf("%zu axial forces\n", fema->curves.size());
+        return Complain(EXIT_CODE::Usage, Say("IDS_RPS_MULTI_CURVE_COUNT"));
+    PrintLine(Say("IDS_QM_CLI_HINGE_AXIAL_FORCES", std::to_string(fema->curves.size())));
     return StoreType(doc, key, type, o.out);
 }
 
@@ -117,15 +113,15 @@ EXIT_CODE RunHingePlot(const T_HINGE_OPTIONS& o)
         T_SECTION_STRENGTH strength;
         SECT_FAULT fault{};
         if (type.yieldSurface) {
-            plot = HingeInteractionPlot(type, type.yieldSurface->yield, "yield level, as entered");
+            plot = HingeInteractionPlot(type, type.yieldSurface->yield,
+                                        Say("IDS_QM_CLI_HINGE_LEVEL_ENTERED"));
         } else if (doc.Attr().GetSect(type.section, section) &&
                    doc.Attr().GetMatl(type.sectionMaterial, material) &&
                    CSectionStrength::Calc(section, material, strength, fault)) {
-            plot = HingeInteractionPlot(type, strength.level, "from section " + section.name);
+            plot = HingeInteractionPlot(type, strength.level,
+                                        Say("IDS_QM_CLI_HINGE_LEVEL_SECTION", section.name));
         } else {
-            return Complain(EXIT_CODE::Usage, o.file + ": hinge type \"" + o.type +
-                                                  "\" has no yield surface and no section that "
-                                                  "gives one");
+            return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_NO_SURFACE", o.file, o.type));
         }
     } else {
         const auto component = ComponentOf(o.component);
@@ -133,13 +129,13 @@ EXIT_CODE RunHingePlot(const T_HINGE_OPTIONS& o)
         T_SKEL_CURVE* curve =
             component ? PageOf(type.components[static_cast<std::size_t>(*component)], o.end, page)
                       : nullptr;
-        if (!curve) return Complain(EXIT_CODE::Usage, "choose a component, Fx to Mz");
+        if (!curve) return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_CHOOSE_COMPONENT"));
         plot = HingeBackbonePlot(type, *component, *curve, EndName(page));
     }
     if (const EXIT_CODE code = WritePicture(plot, o.out); code != EXIT_CODE::Done) return code;
-    std::printf("%s written\n", o.out.c_str());
+    PrintLine(Say("IDS_QM_CLI_HINGE_WRITTEN", o.out));
     return EXIT_CODE::Done;
 #else
-    return Complain(EXIT_CODE::Usage, "this qm-rps was built without pictures");
+    return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_NO_PICTURES"));
 #endif
 }

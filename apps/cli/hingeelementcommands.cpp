@@ -1,6 +1,6 @@
 // Commands on the hinges of elements: their strengths, their assignment and their list.
 #include "hingetools.h"
-#include "qm_base/msgfunction.h"
+#include "qm_base/say.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/desk/elementlist.h"
 #include "qm_rps/hinge/hingegenerator.h"
@@ -31,11 +31,12 @@ bool PrintYieldSide(const T_HINGE_ELEMENT& in, std::size_t c, SKEL_TYPE type, HI
                                                             side.userStiffness, *yield)
                              : CHingeTheta::CalcThetaShear(lookup, k, end, curve.initStiffness,
                                                            side.userStiffness, *yield);
-    std::printf("  %s(%c) %s-end: yield strength %s (%s), yield deformation %s\n",
-                kComponentNames[c], positive ? '+' : '-', end == HINGE_LOCATION::IEnd ? "I" : "J",
-                yield ? FormatText("%.9g", *yield).c_str() : "-",
-                curve.autoYield ? "automatic" : "entered",
-                deform != 0.0 ? FormatText("%.9g", deform).c_str() : "-");
+    PrintLine("  " +
+              Say("IDS_QM_CLI_HINGE_YIELD", kComponentNames[c], positive ? "+" : "-",
+                  EndName(end == HINGE_LOCATION::IEnd ? HINGE_END::I : HINGE_END::J),
+                  yield ? FormatText("%.9g", *yield) : "-",
+                  Say(curve.autoYield ? "IDS_QM_CLI_HINGE_AUTOMATIC" : "IDS_QM_CLI_HINGE_ENTERED"),
+                  deform != 0.0 ? FormatText("%.9g", deform) : "-"));
     return yield.has_value();
 }
 
@@ -66,19 +67,17 @@ bool PrintYield(const CHingeGenerator& generator, const T_PHGE_D& hinge, const T
     T_HINGE_ELEMENT in;
     T_HINGE_REFUSAL refusal;
     if (!generator.ReadElement(type, hinge.element, in, refusal)) {
-        std::printf("%s\n", refusal.text.c_str());
+        PrintLine(refusal.text);
         return false;
     }
-    std::printf("element %d, hinge type %s, section %s, material %s, member length %.6g\n",
-                hinge.element, type.name.c_str(), in.section.name.c_str(), in.material.name.c_str(),
-                in.memberLength);
+    PrintLine(Say("IDS_QM_CLI_HINGE_ON_ELEMENT", std::to_string(hinge.element), type.name,
+                  in.section.name, in.material.name, FormatText("%.6g", in.memberLength)));
     bool whole = true;
     for (std::size_t c = 0; c < type.components.size(); ++c) {
         if (type.components[c].active) whole &= PrintYieldComponent(in, c, type.components[c]);
     }
     if (!whole && in.result->fault != SECT_FAULT::None)
-        std::printf("  %s\n",
-                    zql::lib::MMSGFunction::GetValue(MessageKeyOf(in.result->fault)).c_str());
+        PrintLine("  " + Say(MessageKeyOf(in.result->fault)));
     return whole;
 }
 
@@ -99,7 +98,8 @@ void PrintTable(const std::vector<std::vector<std::string>>& rows)
 /// The crack or the yield strengths of the generated hinges; crack strengths only if there are any.
 void PrintHinges(const CPushOverHingeListDlg& list, bool crack, const T_UNITS& units)
 {
-    std::vector<std::vector<std::string>> table{{"hinge", "element", "type"}};
+    std::vector<std::vector<std::string>> table{
+        {Say("IDS_QM_CLI_HINGE"), Say("IDS_QM_CLI_ELEMENT"), Say("IDS_QM_CLI_HINGE_TYPE")}};
     for (const std::string& head : CPushOverHingeListDlg::Heads())
         table.front().push_back(head);
     bool any = !crack;
@@ -150,13 +150,12 @@ EXIT_CODE RunHingeAssign(const T_HINGE_OPTIONS& o)
     if (const EXIT_CODE code = OpenType(doc, o, key, type); code != EXIT_CODE::Done) return code;
     const std::optional<std::vector<int>> elements = ParseElementList(o.elements);
     if (!elements || elements->empty())
-        return Complain(EXIT_CODE::Usage,
-                        "elements are a list like 1,2,5-9, not \"" + o.elements + "\"");
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_ELEMENT_LIST", o.elements));
     T_HINGE_REFUSAL refusal;
     if (!CHingeGenerator(doc).Generate(key, *elements, refusal))
         return Complain(EXIT_CODE::BadInput, o.file + ": " + refusal.text);
-    std::printf("%zu elements have hinges of type %s\n", doc.Attr().GetElemsByPhgt(key).size(),
-                type.name.c_str());
+    PrintLine(Say("IDS_QM_CLI_HINGE_ASSIGNED",
+                  std::to_string(doc.Attr().GetElemsByPhgt(key).size()), type.name));
     return SaveDocument(doc, o.out);
 }
 
@@ -179,6 +178,6 @@ EXIT_CODE RunHingeGenerated(const T_HINGE_OPTIONS& o)
         PrintHinges(list, false, doc.Unit().Units());
         PrintHinges(list, true, doc.Unit().Units());
     }
-    std::printf("%zu generated hinges\n", count);
+    PrintLine(Say("IDS_QM_CLI_HINGE_GENERATED", std::to_string(count)));
     return EXIT_CODE::Done;
 }

@@ -1,10 +1,11 @@
 #include "hingetools.h"
+#include "qm_base/say.h"
 
 #include <algorithm>
 
 EXIT_CODE NoSuchType(const std::string& file, const std::string& type)
 {
-    return Complain(EXIT_CODE::Usage, file + ": no hinge type named \"" + type + "\"");
+    return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_NO_TYPE", file, type));
 }
 
 std::optional<HINGE_COMPONENT> ComponentOf(const std::string& name)
@@ -14,9 +15,16 @@ std::optional<HINGE_COMPONENT> ComponentOf(const std::string& name)
     return static_cast<HINGE_COMPONENT>(it - kComponentNames.begin());
 }
 
-const char* EndName(HINGE_END end)
+std::string EndName(HINGE_END end)
 {
-    return end == HINGE_END::I ? "I-end" : end == HINGE_END::J ? "J-end" : "both ends";
+    return Say(end == HINGE_END::I   ? "IDS_QM_CLI_HINGE_END_I"
+               : end == HINGE_END::J ? "IDS_QM_CLI_HINGE_END_J"
+                                     : "IDS_QM_CLI_HINGE_END_BOTH");
+}
+
+void PrintLine(const std::string& text)
+{
+    std::printf("%s\n", text.c_str());
 }
 
 EXIT_CODE OpenType(CDBDoc& doc, const T_HINGE_OPTIONS& o, int& key, T_PHGT_D& type)

@@ -29,7 +29,10 @@ EXIT_CODE ForEachType(CDBDoc& doc, const std::string& name, F&& f)
 std::optional<HINGE_COMPONENT> ComponentOf(const std::string& name);
 
 /// "I-end", "J-end" or "both ends".
-const char* EndName(HINGE_END end);
+std::string EndName(HINGE_END end);
+
+/// Prints one line.
+void PrintLine(const std::string& text);
 
 /// Opens the document and takes the type of that name with its key.
 EXIT_CODE OpenType(CDBDoc& doc, const T_HINGE_OPTIONS& o, int& key, T_PHGT_D& type);
