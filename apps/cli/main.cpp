@@ -2,33 +2,44 @@
 #include "output.h"
 #include "qm_base/msgfunction.h"
 #include "qm_base/say.h"
-#include "qm_rps/pushover/pushoverreport.h"
 #include "registrations.h"
 
 #include <CLI/CLI.hpp>
 
 #include <csignal>
 #include <cstdio>
+#include <string_view>
+
+namespace {
+
+/// --lang before the commands are told: their help has words. The parser judges its value.
+void ChooseLanguage(int argc, char** argv)
+{
+    constexpr std::string_view kOption = "--lang";
+    for (int i = 1; i < argc && argv[i][0] == '-'; ++i) {
+        std::string_view value = argv[i];
+        if (!value.starts_with(kOption)) continue;
+        value.remove_prefix(kOption.size());
+        if (value.starts_with('='))
+            value.remove_prefix(1);
+        else if (value.empty() && i + 1 < argc)
+            value = argv[++i];
+        (void)!zql::lib::MMSGFunction::SetLanguage(value);
+    }
+}
+
+} // namespace
 
 int main(int argc, char** argv)
 {
-    CLI::App app{"Linear analysis, unknown load factors, pushover evaluation, plastic hinges",
-                 "qm-rps"};
+    ChooseLanguage(argc, argv);
+    CLI::App app{"", "qm-rps"};
     std::signal(SIGXFSZ, SIG_IGN); // a file-size limit is a write error, not the end
     EXIT_CODE code = EXIT_CODE::Done;
     std::string language = "en";
-    app.set_version_flag("--version", ProductText());
-    app.add_option("--lang", language, "Language of messages: en or it")
-        ->check(CLI::IsMember({"en", "it"}))
-        ->each([](const std::string& l) {
-            const int known = zql::lib::MMSGFunction::SetLanguage(l);
-            (void)known; // checked above
-        });
+    AddHelp(app);
+    app.add_option("--lang", language, Say("IDS_QM_HELP_LANG"))->check(CLI::IsMember({"en", "it"}));
     app.require_subcommand(1);
-    app.footer(
-        "Exit codes: 0 found, 1 a point or factors were not found, 2 usage, 3 bad input, 4 file "
-        "access.\n"
-        "Example:\n  qm-rps evaluate examples/first-steps/case.json");
     AddModel(app, code);
     AddEvaluations(app, code);
     AddHingeCommands(app, code);

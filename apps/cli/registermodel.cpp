@@ -7,32 +7,31 @@ namespace {
 
 void AddImport(CLI::App& app, EXIT_CODE& code)
 {
-    auto* sub = app.add_subcommand("import", "Read a case file and write a model file");
+    auto* sub = app.add_subcommand("import", Say("IDS_QM_HELP_IMPORT"));
     auto in = std::make_shared<std::string>(), out = std::make_shared<std::string>();
-    sub->add_option("CASE", *in, "Case file (.json)")->required();
-    sub->add_option("MODEL", *out, "Model file to write (.qmdb)")->required();
+    sub->add_option("CASE", *in, Say("IDS_QM_HELP_IMPORT_CASE"))->required();
+    sub->add_option("MODEL", *out, Say("IDS_QM_HELP_IMPORT_MODEL"))->required();
     AddExample(sub, "import examples/first-steps/case.json first-steps.qmdb");
     sub->callback([=, &code] { code = RunImport(*in, *out); });
 }
 
 void AddExport(CLI::App& app, EXIT_CODE& code)
 {
-    auto* sub = app.add_subcommand("export", "Write a model as a case file");
+    auto* sub = app.add_subcommand("export", Say("IDS_QM_HELP_EXPORT"));
     auto in = std::make_shared<std::string>(), out = std::make_shared<std::string>("-");
-    sub->add_option("MODEL", *in, "Model file (.qmdb) or case file")->required();
-    sub->add_option("CASE", *out, "Case file to write, - for standard output")
-        ->capture_default_str();
+    sub->add_option("MODEL", *in, Say("IDS_QM_HELP_EXPORT_MODEL"))->required();
+    sub->add_option("CASE", *out, Say("IDS_QM_HELP_EXPORT_CASE"))->capture_default_str();
     AddExample(sub, "export examples/first-steps/case.json -");
     sub->callback([=, &code] { code = RunExport(*in, *out); });
 }
 
 void AddInfo(CLI::App& app, EXIT_CODE& code)
 {
-    auto* sub = app.add_subcommand("info", "Say what a model or case file holds");
+    auto* sub = app.add_subcommand("info", Say("IDS_QM_HELP_INFO"));
     auto in = std::make_shared<std::string>();
     auto check = std::make_shared<bool>(false);
     AddFile(sub, *in);
-    sub->add_flag("--check", *check, "Read the whole file and check every result block");
+    sub->add_flag("--check", *check, Say("IDS_QM_HELP_INFO_CHECK"));
     AddExample(sub, "info examples/first-steps/case.json");
     sub->callback([=, &code] { code = RunInfo(*in, *check); });
 }

@@ -2,6 +2,7 @@
 #pragma once
 
 #include "exitcodes.h"
+#include "qm_base/say.h"
 
 #include <CLI/CLI.hpp>
 
@@ -10,19 +11,25 @@
 
 inline CLI::Option* AddFile(CLI::App* sub, std::string& file)
 {
-    return sub->add_option("FILE", file, "Model file (.qmdb) or case file (.json)")->required();
+    return sub->add_option("FILE", file, Say("IDS_QM_HELP_FILE"))->required();
 }
 
 /// Where a command writes its results as JSON.
 inline CLI::Option* AddJson(CLI::App* sub, std::string& path,
-                            const char* what = "Write the results as JSON; - for standard output")
+                            const std::string& what = Say("IDS_QM_HELP_JSON"))
 {
     return sub->add_option("--json", path, what);
 }
 
+/// What stands below the help: `command` without the program's name.
+inline std::string Example(const std::string& command)
+{
+    return Say("IDS_QM_HELP_EXAMPLE", command);
+}
+
 inline void AddExample(CLI::App* sub, const std::string& command)
 {
-    sub->footer("Example:\n  qm-rps " + command);
+    sub->footer(Example(command));
 }
 
 /// A command with commands below it, whose examples run on one case file.
@@ -34,8 +41,8 @@ struct T_GROUP {
 
 /// One command of the group: its file, its example and what it runs.
 template <class OPTIONS>
-CLI::App* AddOne(const T_GROUP& group, const char* name, const char* what, const char* example,
-                 std::shared_ptr<OPTIONS> o, EXIT_CODE (*run)(const OPTIONS&))
+CLI::App* AddOne(const T_GROUP& group, const char* name, const std::string& what,
+                 const char* example, std::shared_ptr<OPTIONS> o, EXIT_CODE (*run)(const OPTIONS&))
 {
     auto* sub = group.app->add_subcommand(name, what);
     AddFile(sub, o->file);

@@ -10,42 +10,40 @@ using OPTIONS = std::shared_ptr<T_ULF_OPTIONS>;
 
 void AddItem(CLI::App* sub, const OPTIONS& o, bool required)
 {
-    auto* option = sub->add_option("--item", o->item, "Name of the unknown load factor item");
+    auto* option = sub->add_option("--item", o->item, Say("IDS_QM_HELP_ULF_ITEM"));
     if (required) option->required();
 }
 
 void AddSum(CLI::App* sub, bool& sumStageLoads)
 {
-    sub->add_flag(
-        "--sum-stage-loads", sumStageLoads,
-        "Load groups 0 and 1 of a construction-stage item read the sum of all stage loads");
+    sub->add_flag("--sum-stage-loads", sumStageLoads, Say("IDS_QM_HELP_ULF_SUM"));
 }
 
 void AddSolve(const T_GROUP& group, const OPTIONS& o)
 {
-    auto* solve =
-        AddOne(group, "solve", "Find the factors", " --item LEVEL --plot bars.svg", o, RunUlfSolve);
+    auto* solve = AddOne(group, "solve", Say("IDS_QM_HELP_ULF_SOLVE"),
+                         " --item LEVEL --plot bars.svg", o, RunUlfSolve);
     AddItem(solve, o, true);
-    AddJson(solve, o->json, "Write the result as JSON; - for standard output");
-    solve->add_option("--plot", o->plot, "Draw the constraints against their bounds");
+    AddJson(solve, o->json, Say("IDS_QM_HELP_ULF_SOLVE_JSON"));
+    solve->add_option("--plot", o->plot, Say("IDS_QM_HELP_ULF_SOLVE_PLOT"));
     AddSum(solve, o->sumStageLoads);
-    solve->add_option("--shape-plot", o->shapePlot, "Draw the displacements before and after");
+    solve->add_option("--shape-plot", o->shapePlot, Say("IDS_QM_HELP_ULF_SHAPE_PLOT"));
 }
 
 void AddIterate(CLI::App* ulf, EXIT_CODE& code)
 {
     const auto o = std::make_shared<T_ITERATE_OPTIONS>();
-    auto* sub = ulf->add_subcommand("iterate", "Scale pretension until its factors are 1");
+    auto* sub = ulf->add_subcommand("iterate", Say("IDS_QM_HELP_ULF_ITERATE"));
     AddFile(sub, o->file);
-    sub->add_option("--item", o->item, "Name of the construction-stage item")->required();
-    sub->add_option("--iterations", o->iterations, "Required number, 0 to 99")
+    sub->add_option("--item", o->item, Say("IDS_QM_HELP_ULF_STAGE_ITEM"))->required();
+    sub->add_option("--iterations", o->iterations, Say("IDS_QM_HELP_ULF_ITERATIONS"))
         ->capture_default_str();
-    sub->add_option("--tolerance", o->tolerance, "Convergence tolerance")->capture_default_str();
-    sub->add_flag("--overwrite", o->overwrite,
-                  "Overwrite the report (FILE with .ulf) if it exists");
-    sub->add_flag("--append", o->append, "Add to it");
-    AddJson(sub, o->json, "Write the history as JSON; - for standard output");
-    sub->add_option("--plot", o->plot, "Draw factors and tolerance by iteration");
+    sub->add_option("--tolerance", o->tolerance, Say("IDS_QM_HELP_ULF_TOLERANCE"))
+        ->capture_default_str();
+    sub->add_flag("--overwrite", o->overwrite, Say("IDS_QM_HELP_ULF_OVERWRITE"));
+    sub->add_flag("--append", o->append, Say("IDS_QM_HELP_ULF_APPEND"));
+    AddJson(sub, o->json, Say("IDS_QM_HELP_ULF_ITERATE_JSON"));
+    sub->add_option("--plot", o->plot, Say("IDS_QM_HELP_ULF_ITERATE_PLOT"));
     AddSum(sub, o->sumStageLoads);
     AddExample(sub, "ulf iterate bridge.qmdb --item STAYS --tolerance 1e-6");
     sub->callback([=, &code] { code = RunUlfIterate(*o); });
@@ -55,33 +53,31 @@ void AddIterate(CLI::App* ulf, EXIT_CODE& code)
 
 void AddUlf(CLI::App& app, EXIT_CODE& code)
 {
-    auto* ulf = app.add_subcommand("ulf", "Unknown load factors: list, check, solve, explain, "
-                                          "export, combine, iterate");
+    auto* ulf = app.add_subcommand("ulf", Say("IDS_QM_HELP_ULF"));
     ulf->require_subcommand(1);
     AddExample(ulf, "ulf solve examples/cable-stayed-bridge/case.json --item LEVEL");
     const T_GROUP group{ulf, "examples/cable-stayed-bridge/case.json", code};
     const OPTIONS o = std::make_shared<T_ULF_OPTIONS>();
-    AddOne(group, "list", "List items and constraints", "", o, RunUlfList);
-    AddItem(AddOne(group, "check", "Check every rule", "", o, RunUlfCheck), o, false);
+    AddOne(group, "list", Say("IDS_QM_HELP_ULF_LIST"), "", o, RunUlfList);
+    AddItem(AddOne(group, "check", Say("IDS_QM_HELP_CHECK_RULES"), "", o, RunUlfCheck), o, false);
     AddSolve(group, o);
     AddIterate(ulf, code);
-    auto* explain = AddOne(group, "explain", "Say what holds the factors, or what contradicts",
+    auto* explain = AddOne(group, "explain", Say("IDS_QM_HELP_ULF_EXPLAIN"),
                            " --item \"NO UPLIFT\"", o, RunUlfExplain);
     AddItem(explain, o, true);
-    AddJson(explain, o->json, "Write it as JSON; - for standard output");
+    AddJson(explain, o->json, Say("IDS_QM_HELP_ULF_EXPLAIN_JSON"));
     AddSum(explain, o->sumStageLoads);
-    auto* sheet = AddOne(group, "export", "Write the spreadsheet with the influence matrix",
+    auto* sheet = AddOne(group, "export", Say("IDS_QM_HELP_ULF_EXPORT"),
                          " --item LEVEL -o level.xlsx", o, RunUlfExport);
     AddItem(sheet, o, true);
     AddSum(sheet, o->sumStageLoads);
-    sheet->add_option("-o", o->out, "Spreadsheet to write (.xlsx)")->required();
-    sheet->add_option("--date", o->date, "Date in the sheet, YYYY-MM-DD (default: today)");
-    sheet->add_option("--sheet-version", o->sheetVersion, "Version of the spreadsheet program")
+    sheet->add_option("-o", o->out, Say("IDS_QM_HELP_ULF_SHEET"))->required();
+    sheet->add_option("--date", o->date, Say("IDS_QM_HELP_ULF_DATE"));
+    sheet->add_option("--sheet-version", o->sheetVersion, Say("IDS_QM_HELP_ULF_SHEET_VERSION"))
         ->capture_default_str();
-    auto* combine = AddOne(group, "combine", "Add the load combination with the factors",
+    auto* combine = AddOne(group, "combine", Say("IDS_QM_HELP_ULF_COMBINE"),
                            " --item LEVEL --name TUNED -o tuned.json", o, RunUlfCombine);
     AddItem(combine, o, true);
-    combine->add_option("--name", o->name, "Name of the combination")->required();
-    combine->add_option("-o", o->out,
-                        "File to write: .qmdb or case file (default: the model file)");
+    combine->add_option("--name", o->name, Say("IDS_QM_HELP_ULF_NAME"))->required();
+    combine->add_option("-o", o->out, Say("IDS_QM_HELP_ULF_OUT"));
 }

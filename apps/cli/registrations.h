@@ -8,6 +8,8 @@ namespace CLI {
 class App;
 }
 
+/// Description, labels, version and what stands below; the commands take them over.
+void AddHelp(CLI::App& app);
 void AddModel(CLI::App& app, EXIT_CODE& code);
 void AddEvaluations(CLI::App& app, EXIT_CODE& code);
 void AddHingeCommands(CLI::App& app, EXIT_CODE& code);
