@@ -64,7 +64,6 @@ public:
         : m_binding(std::move(binding)), m_texts(std::move(texts)), m_box(new QComboBox(parent))
     {
         widget = m_box;
-        m_box->setSizeAdjustPolicy(QComboBox::AdjustToContents);
         QObject::connect(m_box, &QComboBox::activated, [this, changed](int index) {
             m_binding.set(index);
             changed();
@@ -73,7 +72,15 @@ public:
     void Show() override
     {
         const QSignalBlocker quiet(m_box);
-        const std::vector<std::string> texts = m_texts();
+        if (const std::vector<std::string> texts = m_texts(); texts != m_shown) ShowTexts(texts);
+        const int index = m_binding.get();
+        m_box->setCurrentIndex(index < m_box->count() ? index : -1);
+    }
+
+private:
+    void ShowTexts(const std::vector<std::string>& texts)
+    {
+        m_shown = texts;
         while (m_box->count() > static_cast<int>(texts.size()))
             m_box->removeItem(m_box->count() - 1);
         for (int i = 0; i < static_cast<int>(texts.size()); ++i) {
@@ -83,13 +90,15 @@ public:
             else
                 m_box->addItem(text);
         }
-        const int index = m_binding.get();
-        m_box->setCurrentIndex(index < m_box->count() ? index : -1);
+        // Changing the policy measures the texts anew. It must not stay at AdjustToContents, which
+        // resizes the box 20 ms after each change, past the layout that has placed it.
+        m_box->setSizeAdjustPolicy(QComboBox::AdjustToContents);
+        m_box->setSizeAdjustPolicy(QComboBox::AdjustToContentsOnFirstShow);
     }
 
-private:
     T_BINDING<int> m_binding;
     std::function<std::vector<std::string>()> m_texts;
+    std::vector<std::string> m_shown;
     QComboBox* m_box;
 };
 
