@@ -21,8 +21,6 @@ public:
     /// Handles what has come in; windows are not closed by it, nor are system commands carried out.
     void DispatchEvents() override;
 
-    const CViewFactory& Factory() const { return m_factory; }
-
 private:
     int Ask(const std::string& text, QMessageBox::StandardButtons buttons,
             QMessageBox::StandardButton preset);
