@@ -2,10 +2,9 @@
 
 #include "qm_base/messagecatalogue.h"
 #include "qm_base/messagetext.h"
+#include "tempfolder.h"
 
 #include <filesystem>
-#include <fstream>
-#include <sstream>
 
 using zql::lib::CMessageCatalogue;
 
@@ -25,11 +24,18 @@ void AuditPair(const CMessageCatalogue& reference, const CMessageCatalogue& othe
         if (!reference.Find(key)) findings.push_back(language + ": unknown " + key);
 }
 
-std::string ReadFile(const std::filesystem::path& path)
+/// The keys that stand in a source as string literals, in order, repetitions included.
+std::vector<std::string> KeysInSource(std::string_view source)
 {
-    std::ostringstream text;
-    text << std::ifstream(path, std::ios::binary).rdbuf();
-    return text.str();
+    constexpr std::string_view kStart = "\"IDS_";
+    std::vector<std::string> keys;
+    for (std::size_t at = source.find(kStart); at != std::string_view::npos;
+         at = source.find(kStart, at)) {
+        const std::size_t end = source.find('"', ++at);
+        keys.emplace_back(source.substr(at, end - at));
+        at = end == std::string_view::npos ? end : end + 1;
+    }
+    return keys;
 }
 
 } // namespace
@@ -56,19 +62,6 @@ std::vector<std::string> AuditMessages(std::span<const T_AUDIT_TEXT> catalogues,
     return findings;
 }
 
-std::vector<std::string> KeysInSource(std::string_view source)
-{
-    constexpr std::string_view kStart = "\"IDS_";
-    std::vector<std::string> keys;
-    for (std::size_t at = source.find(kStart); at != std::string_view::npos;
-         at = source.find(kStart, at)) {
-        const std::size_t end = source.find('"', ++at);
-        keys.emplace_back(source.substr(at, end - at));
-        at = end == std::string_view::npos ? end : end + 1;
-    }
-    return keys;
-}
-
 std::vector<T_AUDIT_TEXT> SourcesBelow(const std::string& folder)
 {
     namespace fs = std::filesystem;
@@ -77,7 +70,7 @@ std::vector<T_AUDIT_TEXT> SourcesBelow(const std::string& folder)
     for (const fs::directory_entry& entry : fs::recursive_directory_iterator(folder, error)) {
         const fs::path& path = entry.path();
         if (path.extension() == ".h" || path.extension() == ".cpp")
-            sources.push_back({path.string(), ReadFile(path)});
+            sources.push_back({path.string(), ReadText(path)});
     }
     return sources;
 }

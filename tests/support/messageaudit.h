@@ -16,8 +16,5 @@ struct T_AUDIT_TEXT {
 std::vector<std::string> AuditMessages(std::span<const T_AUDIT_TEXT> catalogues,
                                        std::span<const T_AUDIT_TEXT> sources);
 
-/// The keys that stand in a source as string literals, in order, repetitions included.
-std::vector<std::string> KeysInSource(std::string_view source);
-
 /// Every .h and .cpp file below a folder; empty when there is none.
 std::vector<T_AUDIT_TEXT> SourcesBelow(const std::string& folder);

@@ -1,30 +1,29 @@
 // The picture of constraint values against their bounds.
+#include "numbers.h"
+#include "plotmeasure.h"
 #include "qm_ui/factors/ulfplot.h"
-#include "qm_ui/plot/plotlayout.h"
 
 #include <cmath>
 #include <gtest/gtest.h>
-#include <limits>
 
 namespace {
 
 TEST(UlfPosition, IsOneOnTheUpperAndMinusOneOnTheLowerBound)
 {
-    const double nan = std::numeric_limits<double>::quiet_NaN();
     const struct {
         const char* label;
-        double value, upper, lower, position; // nan: no bound
+        double value, upper, lower, position; // not a number: no bound
     } kRows[] = {
         {"on upper", 0.01, 0.01, -0.03, 1.0},
         {"on lower", -0.03, 0.01, -0.03, -1.0},
         {"middle", -0.01, 0.01, -0.03, 0.0},
         {"beyond", 0.02, 0.01, -0.03, 1.5},
-        {"upper alone", 500.0, 2000.0, nan, 0.25},
-        {"upper below zero", -300.0, -200.0, nan, 0.5},
-        {"upper below zero, missed", -100.0, -200.0, nan, 1.5},
-        {"lower alone", -450.0, nan, -900.0, -0.5},
-        {"on a bound of zero", 0.0, 0.0, nan, 1.0},
-        {"past a bound of zero", 5.0, 0.0, nan, 2.0},
+        {"upper alone", 500.0, 2000.0, kNan, 0.25},
+        {"upper below zero", -300.0, -200.0, kNan, 0.5},
+        {"upper below zero, missed", -100.0, -200.0, kNan, 1.5},
+        {"lower alone", -450.0, kNan, -900.0, -0.5},
+        {"on a bound of zero", 0.0, 0.0, kNan, 1.0},
+        {"past a bound of zero", 5.0, 0.0, kNan, 2.0},
         {"equality met", 7.0, 7.0, 7.0, 0.0},
         {"equality missed", 7.7, 7.0, 7.0, 0.7 / 7.7},
         {"equality with zero met", 0.0, 0.0, 0.0, 0.0},
@@ -40,9 +39,6 @@ TEST(UlfPosition, IsOneOnTheUpperAndMinusOneOnTheLowerBound)
 
 TEST(UlfPlot, HasARowForEachConstraintThatNothingCovers)
 {
-    const auto measure = [](const std::string& line, double sizePx, bool) {
-        return static_cast<double>(line.size()) * sizePx * 0.58;
-    };
     for (const std::size_t count : {std::size_t{1}, std::size_t{8}, std::size_t{60}}) {
         T_ULF_PICTURE picture;
         for (std::size_t i = 0; i < count; ++i) {
@@ -52,7 +48,7 @@ TEST(UlfPlot, HasARowForEachConstraintThatNothingCovers)
             picture.bars.push_back(bar);
         }
         const T_PLOT plot = UlfPlot(picture);
-        const T_PLOT_LAYOUT out = CPlotLayout(plot, measure).Calc({0, 0, 960, plot.pageHeight}, {});
+        const T_PLOT_LAYOUT out = LayoutOf(plot, {}, {0, 0, 960, plot.pageHeight});
         ASSERT_EQ(count, out.yTicks.major.size());
         ASSERT_TRUE(out.legend);
         double lowest = 0.0;

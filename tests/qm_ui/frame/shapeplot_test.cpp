@@ -1,6 +1,6 @@
 // Deformed shapes: the cubic of a member, the view, the scale.
+#include "plotmeasure.h"
 #include "qm_ui/frame/shapeplot.h"
-#include "qm_ui/plot/plotlayout.h"
 
 #include <cmath>
 #include <gtest/gtest.h>
@@ -93,14 +93,11 @@ TEST(ShapePlot, OneRoundScaleForAllStatesStandsInTheLegend)
 
 TEST(ShapePlot, ScalesAreEqualInBothDirections)
 {
-    const auto measure = [](const std::string& line, double sizePx, bool) {
-        return static_cast<double>(line.size()) * sizePx * 0.58;
-    };
     T_SHAPE s = Beam({}, {0, 0, 0.1, 0, 0, 0});
     for (const double height : {0.1, 8.0, 300.0}) {
         s.nodes[1].xyz[2] = height;
         const T_PLOT plot = ShapePlot(s);
-        const T_PLOT_LAYOUT out = CPlotLayout(plot, measure).Calc({0, 0, 960, 640}, {});
+        const T_PLOT_LAYOUT out = LayoutOf(plot);
         const double right = out.x.ToPixel(1.0) - out.x.ToPixel(0.0);
         const double up = out.y.ToPixel(0.0) - out.y.ToPixel(1.0);
         EXPECT_NEAR(right, up, 1e-9 * right) << height;

@@ -1,22 +1,13 @@
 #include "qm_ui/plot/plotlayout.h"
 
 #include "numbers.h"
+#include "plotmeasure.h"
 
 #include <gtest/gtest.h>
 
 #include <string>
 
 namespace {
-
-constexpr T_PLOT_BOX kPage{0, 0, 960, 640};
-
-T_PLOT_LAYOUT Calc(const T_PLOT& plot, const T_PLOT_VIEW& view = {}, T_PLOT_BOX page = kPage)
-{
-    const auto measure = [](const std::string& line, double sizePx, bool bold) {
-        return static_cast<double>(line.size()) * sizePx * (bold ? 0.66 : 0.58);
-    };
-    return CPlotLayout(plot, measure).Calc(page, view);
-}
 
 T_PLOT Curve()
 {
@@ -45,7 +36,7 @@ TEST(PlotLayout, TwentyCloseLabelsStandApart)
     T_PLOT plot = Curve();
     for (int i = 0; i < 20; ++i)
         plot.labels.push_back({2.0 + 0.01 * i, 8.0 + 0.005 * i, "hinge " + std::to_string(i + 1)});
-    const T_PLOT_LAYOUT layout = Calc(plot);
+    const T_PLOT_LAYOUT layout = LayoutOf(plot);
     EXPECT_EQ(20u, layout.labels.size());
     ASSERT_TRUE(layout.legend);
     ExpectApart(layout);
@@ -64,7 +55,7 @@ TEST(PlotLayout, RadialLinePassesThroughTheOriginWithItsSlope)
     plot.x.range = T_PLOT_RANGE{0, 4};
     plot.y.range = T_PLOT_RANGE{0, 10};
     plot.guides.push_back({PLOT_GUIDE::Radial, 5.0, "", {}, {}});
-    const T_PLOT_LAYOUT layout = Calc(plot);
+    const T_PLOT_LAYOUT layout = LayoutOf(plot);
     ASSERT_EQ(1u, layout.guides.size());
     const PLOT_RUN& run = layout.guides[0].lines.at(0);
     EXPECT_NEAR(layout.x.ToPixel(0.0), run.front().x, 1e-9);
@@ -77,7 +68,7 @@ TEST(PlotLayout, LegendHidesNothingWhenACornerIsFree)
 {
     T_PLOT plot; // takes the top right corner, where the legend would go otherwise
     plot.series.push_back({"rising", {0, 1, 2, 3}, {0.5, 9, 9.5, 10}});
-    const T_PLOT_LAYOUT layout = Calc(plot);
+    const T_PLOT_LAYOUT layout = LayoutOf(plot);
     ASSERT_TRUE(layout.legend);
     for (PLOT_RUN run : layout.curves[0].lines)
         for (std::size_t i = 1; i < run.size(); ++i)
@@ -88,12 +79,12 @@ TEST(PlotLayout, PointsThatAreNotFiniteLeaveAGap)
 {
     T_PLOT plot;
     plot.series.push_back({"s", {0, 1, 2, 3, kNan, 5, 6}, {1, 2, kNan, 3, 4, 5, 6, 7, 8}});
-    const T_PLOT_LAYOUT layout = Calc(plot);
+    const T_PLOT_LAYOUT layout = LayoutOf(plot);
     EXPECT_TRUE(layout.hasData);
-    ASSERT_EQ(3u, layout.curves[0].lines.size());
-    EXPECT_EQ(2u, layout.curves[0].lines[0].size());
-    EXPECT_EQ(1u, layout.curves[0].lines[1].size());
-    EXPECT_EQ(2u, layout.curves[0].lines[2].size());
+    std::vector<std::size_t> points;
+    for (const PLOT_RUN& run : layout.curves[0].lines)
+        points.push_back(run.size());
+    EXPECT_EQ((std::vector<std::size_t>{2, 1, 2}), points);
 }
 
 TEST(PlotLayout, CurvesNeverLeaveTheFrame)
@@ -103,7 +94,7 @@ TEST(PlotLayout, CurvesNeverLeaveTheFrame)
     T_PLOT_VIEW view;
     view.x = T_PLOT_RANGE{1.5, 2.5};
     view.y = T_PLOT_RANGE{7, 8.2};
-    const T_PLOT_LAYOUT layout = Calc(plot, view);
+    const T_PLOT_LAYOUT layout = LayoutOf(plot, view);
     for (const T_PLOT_CURVE& c : layout.curves)
         for (const PLOT_RUN& run : c.lines)
             for (const T_PLOT_PX& p : run)
@@ -117,10 +108,10 @@ TEST(PlotLayout, TextsStayOnThePageAndTickLabelsApart)
     T_PLOT plot = Curve();
     plot.x.range = T_PLOT_RANGE{1000.0001, 1000.00019}; // long labels
     plot.notes = {"one", "two", "three"};
-    const T_PLOT_LAYOUT layout = Calc(plot);
+    const T_PLOT_LAYOUT layout = LayoutOf(plot);
     ASSERT_GE(layout.xTicks.major.size(), 2u);
     for (std::size_t i = 0; i < layout.texts.size(); ++i) {
-        EXPECT_TRUE(kPage.Holds(layout.texts[i].box)) << layout.texts[i].text;
+        EXPECT_TRUE(T_PLOT_BOX(0, 0, 960, 640).Holds(layout.texts[i].box)) << layout.texts[i].text;
         for (std::size_t k = 0; k < i; ++k)
             EXPECT_FALSE(layout.texts[i].box.Meets(layout.texts[k].box))
                 << layout.texts[i].text << " on " << layout.texts[k].text;
