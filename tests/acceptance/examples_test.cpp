@@ -2,21 +2,10 @@
 #include "program.h"
 
 #include <cmath>
-#include <gtest/gtest.h>
-#include <nlohmann/json.hpp>
 
 namespace {
 
-using json = nlohmann::json;
-
-json Exported(const std::string& example)
-{
-    const CTempFolder folder;
-    const std::string model = folder / "m.qmdb";
-    const T_RUN import = RunProgram({"import", ExampleCase(example), model});
-    EXPECT_EQ(0, import.code) << import.err;
-    return json::parse(RunProgram({"export", model}).out);
-}
+using Examples = CProgramTest;
 
 const json& StepsOf(const json& document, const std::string& push)
 {
@@ -67,14 +56,18 @@ const T_STEP kSteps[] = {
 };
 // clang-format on
 
-TEST(Examples, RecorderFilesGiveTheSolversOwnCurve)
+TEST_F(Examples, RecorderFilesGiveTheSolversOwnCurve)
 {
     constexpr double kRelative = 1.5e-9; // last of the ten digits that both files print
     const auto near = [](double a, double b) { return std::fabs(a - b) <= kRelative * b + 1.5e-9; };
     std::string name;
     json document;
     for (const T_STEP& s : kSteps) {
-        if (name != s.example) document = Exported(name = s.example);
+        if (name != s.example) {
+            name = s.example;
+            Done("import @" + name + " m.qmdb");
+            document = json::parse(Done("export m.qmdb"));
+        }
         const json& steps = StepsOf(document, s.push);
         const std::string label = name + " " + s.push + " step " + std::to_string(s.step) + ": ";
         const auto at = [&](const json& series) { return series.at(s.step - 1).get<double>(); };

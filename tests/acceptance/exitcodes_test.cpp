@@ -1,81 +1,70 @@
 // What the exit codes say: 0 found, 1 not found, 2 usage, 3 bad input, 4 file access.
 #include "program.h"
 
-#include <gtest/gtest.h>
-
 namespace {
 
-TEST(ExitCode, Is1WhenOnePointWasNotFound)
+using ExitCode = CProgramTest;
+
+TEST_F(ExitCode, Is1WhenOnePointWasNotFound)
 {
-    const std::string file = ExampleCase("steel-frame-2-storey");
-    const T_RUN run = RunProgram({"evaluate", file, "--only", "PX_MODE1 ATC-40 A beyond capacity"});
+    const T_RUN run =
+        Run("evaluate @steel-frame-2-storey --only 'PX_MODE1 ATC-40 A beyond capacity'");
     EXPECT_EQ(1, run.code);
     EXPECT_EQ("", run.err);
-    EXPECT_NE(std::string::npos, run.out.find("not found"));
-    EXPECT_NE(std::string::npos, run.out.find("no crossing with the reduced demand"));
-    EXPECT_EQ(0, RunProgram({"evaluate", file, "--only", "PX_MODE1 ATC-40 A"}).code);
+    ExpectHolds(run.out, {"not found", "no crossing with the reduced demand"});
+    Done("evaluate @steel-frame-2-storey --only 'PX_MODE1 ATC-40 A'");
 }
 
-TEST(ExitCode, Is2ForWrongUsage)
+TEST_F(ExitCode, TellsWhyNothingWasDone)
 {
-    const std::string file = ExampleCase("first-steps");
-    const std::vector<std::string> cases[] = {
-        {},
-        {"calculate", file},
-        {"evaluate"},
-        {"evaluate", file, "--fast"},
-        {"evaluate", file, "--only"},
-        {"evaluate", file, "--only", "no such evaluation"},
-        {"--lang", "de", "info", file},
-        {"import", file},
-    };
-    for (const auto& arguments : cases) {
-        const T_RUN run = RunProgram(arguments);
-        const std::string label = arguments.empty() ? "no argument" : arguments.back();
-        EXPECT_EQ(2, run.code) << label;
-        EXPECT_EQ("", run.out) << label;
-        EXPECT_EQ(1U, Lines(run.err).size()) << label << ": " << run.err;
-    }
-}
-
-TEST(ExitCode, Is4WhenAFileCantBeReadOrWritten)
-{
-    const CTempFolder folder;
-    const std::string file = ExampleCase("first-steps");
-    const std::string nowhere = folder / "no-folder/x";
-    const std::vector<std::string> cases[] = {
-        {"evaluate", nowhere},
-        {"info", nowhere},
-        {"info", nowhere + ".qmdb"},
-        {"import", nowhere, folder / "m.qmdb"},
-        {"export", nowhere + ".qmdb"},
-        {"import", file, nowhere + ".qmdb"},
-        {"export", file, nowhere},
-        {"evaluate", file, "--json", nowhere},
-        {"evaluate", file, "--report", nowhere},
-        {"evaluate", file, "--curve", nowhere},
+    const struct {
+        const char* arguments;
+        int code;
+        const char* says = "";
+    } kRows[] = {
+        {"", 2},
+        {"calculate @first-steps", 2},
+        {"evaluate", 2},
+        {"evaluate @first-steps --fast", 2},
+        {"evaluate @first-steps --only", 2},
+        {"evaluate @first-steps --only 'no such evaluation'", 2},
+        {"evaluate @first-steps --add-step 41", 2}, // the push has 40 steps
+        {"evaluate @first-steps --add-spectrum 'no such spectrum'", 2},
+        {"compare @first-steps --push PX --spectrum none", 2},
+        {"compare @first-steps --push none --spectrum ATC", 2},
+        {"--lang de info @first-steps", 2},
+        {"import @first-steps", 2},
+        {"analyse @tuned-beam --case none", 2},
+        {"analyse @tuned-beam --modes 0", 2},
+        {"analyse @first-steps", 3}, // no load cases
+        {"evaluate no/x", 4, "no/x"},
+        {"info no/x", 4, "no/x"},
+        {"info no/x.qmdb", 4, "no/x"},
+        {"import no/x m.qmdb", 4, "no/x"},
+        {"export no/x.qmdb", 4, "no/x"},
+        {"import @first-steps no/x.qmdb", 4, "no/x"},
+        {"export @first-steps no/x", 4, "no/x"},
+        {"evaluate @first-steps --json no/x", 4, "no/x"},
+        {"evaluate @first-steps --report no/x", 4, "no/x"},
+        {"evaluate @first-steps --curve no/x", 4, "no/x"},
+        {"analyse no/x", 4, "no/x"},
 #ifdef QM_UI
-        {"evaluate", file, "--only", "PX ATC-40 A", "--plot", nowhere + ".svg"},
+        {"evaluate @first-steps --json o.json --only 'PX ATC-40 A' --plot p.gif", 2, "p.gif"},
+        {"analyse @tuned-beam --plot p.gif", 2, "p.gif"},
+        {"evaluate @first-steps --only 'PX ATC-40 A' --plot no/x.svg", 4, "no/x"},
 #endif
     };
-    for (const auto& arguments : cases) {
-        const T_RUN run = RunProgram(arguments);
-        const std::string label = arguments[0] + " ... " + arguments.back();
-        EXPECT_EQ(4, run.code) << label;
-        EXPECT_EQ("", run.out) << label;
-        ASSERT_EQ(1U, Lines(run.err).size()) << label << ": " << run.err;
-        EXPECT_NE(std::string::npos, run.err.find(nowhere)) << label << ": " << run.err;
-        EXPECT_TRUE(folder.Names().empty()) << label;
+    for (const auto& row : kRows) {
+        ExpectRefused(row.arguments, row.code, row.says);
+        EXPECT_TRUE(m_folder.Names().empty()) << row.arguments;
     }
+    EXPECT_EQ(4, Run("analyse @tuned-beam --json no/x").code); // after its tables
 }
 
-TEST(ExitCode, Is0ForVersionAndHelp)
+TEST_F(ExitCode, Is0ForVersionAndHelp)
 {
-    const T_RUN version = RunProgram({"--version"});
-    EXPECT_EQ(0, version.code);
-    EXPECT_EQ("qm_rps 0.1.0\n", version.out);
-    for (const char* command : {"import", "export", "info", "evaluate"})
-        EXPECT_EQ(0, RunProgram({command, "--help"}).code) << command;
+    EXPECT_EQ("qm_rps 0.1.0\n", Done("--version"));
+    Done("export --help");
 }
 
 } // namespace

@@ -3,128 +3,109 @@
 #include "stagecase.h"
 
 #include <cmath>
-#include <gtest/gtest.h>
-#include <nlohmann/json.hpp>
 
 namespace {
 
-using json = nlohmann::json;
 using NAMES = std::vector<std::string>;
 
-class Iterate : public testing::Test {
+class Iterate : public CProgramTest {
 protected:
-    Iterate() { WriteText(m_file, kStageCase); }
-    T_RUN Run(const std::string& item, const std::vector<std::string>& more = {}) const
+    Iterate() { Write("m.json", kStageCase); }
+    T_RUN Item(const std::string& arguments) const
     {
-        std::vector<std::string> arguments{"ulf", "iterate", m_file, "--item", item};
-        arguments.insert(arguments.end(), more.begin(), more.end());
-        return RunProgram(arguments);
+        return Run("ulf iterate m.json --item " + arguments);
     }
+    json Result() const { return json::parse(Text("r.json")); }
     /// Tension of load case T in a file of the folder.
     double Tension(const std::string& name) const
     {
-        const json document = json::parse(ReadText(m_folder / name));
-        return document.at("load_cases").at(1).at("pretension").at(0).at("force");
+        return json::parse(Text(name)).at("load_cases").at(1).at("pretension").at(0).at("force");
     }
-    std::string Report() const { return ReadText(m_folder / "m.ulf"); }
-    static std::size_t Count(const std::string& text, const std::string& piece)
+    /// Iterations in the report.
+    static std::size_t Blocks(const std::string& report)
     {
+        const std::string head = "     Iteration = ";
         std::size_t n = 0;
-        for (auto at = text.find(piece); at != std::string::npos; at = text.find(piece, at + 1))
+        for (auto at = report.find(head); at != std::string::npos; at = report.find(head, at + 1))
             ++n;
         return n;
     }
-    std::size_t Blocks() const { return Count(Report(), "     Iteration = "); }
-
-    const CTempFolder m_folder;
-    const std::string m_file = m_folder / "m.json";
+    /// The only factor and the tolerance of each iteration.
+    static void ExpectHistory(const json& result,
+                              const std::vector<std::pair<double, double>>& expected)
+    {
+        const json& history = result.at("history");
+        ASSERT_EQ(expected.size(), history.size());
+        for (std::size_t k = 0; k < expected.size(); ++k) {
+            EXPECT_EQ(k, history[k].at("iteration"));
+            ASSERT_EQ(1U, history[k].at("factors").size());
+            EXPECT_NEAR(expected[k].first, history[k].at("factors")[0].at("factor"), 1e-9) << k;
+            EXPECT_NEAR(expected[k].second, history[k].at("tolerance"), 1e-9) << k;
+        }
+    }
 };
 
 TEST_F(Iterate, HistoryIsTheHandCalculation)
 {
-    const T_RUN run = Run("STAY", {"--json", "-", "--tolerance", "1e-9"});
-    ASSERT_EQ(0, run.code) << run.err;
-    const json r = json::parse(run.out);
+    const json r = Json("ulf iterate m.json --item STAY --tolerance 1e-9");
     EXPECT_EQ("converged", r.at("status"));
-    EXPECT_EQ(m_folder / "m.ulf", r.at("report"));
-    const double factors[] = {4.0, 1.0}, tolerances[] = {3.0, 0.0}; // T = 4 holds the node
-    const char* const files[] = {"m.json", "m_01.json"};
-    ASSERT_EQ(2U, r.at("history").size());
-    for (std::size_t k = 0; k < 2; ++k) {
-        const json& step = r.at("history").at(k);
-        EXPECT_EQ(k, step.at("iteration"));
-        EXPECT_EQ(m_folder / files[k], step.at("file"));
-        ASSERT_EQ(1U, step.at("factors").size());
-        EXPECT_EQ("S1/First Step", step.at("factors").at(0).at("place"));
-        EXPECT_EQ(true, step.at("factors").at(0).at("pretension"));
-        EXPECT_NEAR(factors[k], step.at("factors").at(0).at("factor").get<double>(), 1e-12);
-        EXPECT_NEAR(tolerances[k], step.at("tolerance").get<double>(), 1e-12);
-    }
+    EXPECT_EQ("m.ulf", r.at("report"));
+    ExpectHistory(r, {{4.0, 3.0}, {1.0, 0.0}}); // T = 4 holds the node
+    const json& first = r.at("history").at(0);
+    EXPECT_EQ("m.json", first.at("file"));
+    EXPECT_EQ("m_01.json", r.at("history").at(1).at("file"));
+    EXPECT_EQ("S1/First Step", first.at("factors").at(0).at("place"));
+    EXPECT_EQ(true, first.at("factors").at(0).at("pretension"));
     EXPECT_EQ((NAMES{"m.json", "m.ulf", "m_01.json"}), m_folder.Names());
-    EXPECT_EQ(kStageCase, ReadText(m_file)) << "the file itself stays";
+    EXPECT_EQ(kStageCase, Text("m.json")) << "the file itself stays";
     EXPECT_NEAR(4.0, Tension("m_01.json"), 1e-12);
-    EXPECT_EQ(2U, Blocks());
+    EXPECT_EQ(2U, Blocks(Text("m.ulf")));
     // The copy, read anew, needs no change: its factor is 1.
-    const T_RUN again =
-        RunProgram({"ulf", "solve", m_folder / "m_01.json", "--item", "STAY", "--json", "-"});
-    EXPECT_NEAR(1.0, json::parse(again.out).at("factors").at("S1/First Step T").get<double>(),
-                1e-12);
+    const json again = Json("ulf solve m_01.json --item STAY");
+    EXPECT_NEAR(1.0, again.at("factors").at("S1/First Step T"), 1e-12);
 }
 
 TEST_F(Iterate, KeepsTheSignOfARestrictedFactor)
 {
-    const T_RUN run = Run("LEAST", {"--json", m_folder / "r.json", "--tolerance", "1e-6"});
+    const T_RUN run = Item("LEAST --json r.json --tolerance 1e-6");
     ASSERT_EQ(0, run.code) << run.err;
-    const json history = json::parse(ReadText(m_folder / "r.json")).at("history");
-    EXPECT_NEAR(2.0, history.at(0).at("factors").at(0).at("factor").get<double>(), 1e-9);
+    EXPECT_NEAR(2.0, Result().at("history").at(0).at("factors").at(0).at("factor"), 1e-9);
     EXPECT_NEAR(2.0, Tension("m_01.json"), 1e-9);
-    EXPECT_NE(std::string::npos, run.out.find("S1/First Step")) << "the table is printed, too";
+    ExpectHolds(run.out, {"S1/First Step"});
     // No negative tension holds the node: nothing is written.
     std::filesystem::remove(m_folder / "m.ulf");
-    const T_RUN none = Run("SIGN");
+    const T_RUN none = Item("SIGN");
     EXPECT_EQ(1, none.code);
-    EXPECT_NE(std::string::npos, none.err.find("no factors found")) << none.err;
+    ExpectHolds(none.err, {"no factors found"});
     EXPECT_FALSE(std::filesystem::exists(m_folder / "m.ulf"));
 }
 
 TEST_F(Iterate, ExistingReportIsOverwrittenOrAddedToOnlyWhenAsked)
 {
-    WriteText(m_folder / "m.ulf", "mine\n");
-    const T_RUN refused = Run("STAY");
-    EXPECT_EQ(4, refused.code);
-    EXPECT_NE(std::string::npos, refused.err.find("--overwrite or --append")) << refused.err;
-    EXPECT_EQ("mine\n", Report());
+    Write("m.ulf", "mine\n");
+    ExpectRefused("ulf iterate m.json --item STAY", 4, "--overwrite or --append");
+    ExpectRefused("ulf iterate m.json --item STAY --append --overwrite", 2, "");
+    EXPECT_EQ("mine\n", Text("m.ulf"));
     EXPECT_EQ((NAMES{"m.json", "m.ulf"}), m_folder.Names());
-    EXPECT_EQ(2, Run("STAY", {"--append", "--overwrite"}).code);
-    EXPECT_EQ("mine\n", Report());
-    EXPECT_EQ(0, Run("STAY", {"--append"}).code);
-    EXPECT_TRUE(Report().starts_with("mine\n         +="));
-    EXPECT_EQ(2U, Blocks());
-    EXPECT_EQ(0, Run("STAY", {"--overwrite"}).code);
-    EXPECT_TRUE(Report().starts_with("         +="));
-    EXPECT_EQ(2U, Blocks());
+    for (const auto& [option, start] :
+         {std::pair{"--append", "mine\n         +="}, std::pair{"--overwrite", "         +="}}) {
+        EXPECT_EQ(0, Item(std::string("STAY ") + option).code);
+        EXPECT_TRUE(Text("m.ulf").starts_with(start)) << option;
+        EXPECT_EQ(2U, Blocks(Text("m.ulf"))) << option;
+    }
 }
 
 TEST_F(Iterate, RunsAwayNoFurtherThanRequiredAndShowsHow)
 {
-    const T_RUN run =
-        Run("WILD", {"--sum-stage-loads", "--iterations", "2", "--json", m_folder / "r.json"});
+    const T_RUN run = Item("WILD --sum-stage-loads --iterations 2 --json r.json");
     EXPECT_EQ(1, run.code);
-    EXPECT_NE(std::string::npos, run.err.find("not converged")) << run.err;
-    const json r = json::parse(ReadText(m_folder / "r.json"));
-    EXPECT_EQ("not converged", r.at("status"));
-    const double factors[] = {4.0 / 3, 1.5, 2.0}, tolerances[] = {1.0 / 3, 0.5, 1.0};
-    ASSERT_EQ(3U, r.at("history").size());
-    for (std::size_t k = 0; k < 3; ++k) {
-        const json& step = r.at("history").at(k);
-        EXPECT_NEAR(factors[k], step.at("factors").at(0).at("factor").get<double>(), 1e-9);
-        EXPECT_NEAR(tolerances[k], step.at("tolerance").get<double>(), 1e-9);
-    }
-    for (const char* text : {"0.333333", "0.5", "m_02.json", "S1/First Step"})
-        EXPECT_NE(std::string::npos, run.out.find(text)) << run.out;
+    ExpectHolds(run.err, {"not converged"});
+    EXPECT_EQ("not converged", Result().at("status"));
+    ExpectHistory(Result(), {{4.0 / 3, 1.0 / 3}, {1.5, 0.5}, {2.0, 1.0}});
+    ExpectHolds(run.out, {"0.333333", "0.5", "m_02.json", "S1/First Step"});
     EXPECT_NEAR(2.0, Tension("m_02.json"), 1e-9);
     EXPECT_FALSE(std::filesystem::exists(m_folder / "m_03.json"));
-    EXPECT_EQ(3U, Blocks());
+    EXPECT_EQ(3U, Blocks(Text("m.ulf")));
 }
 
 // T1 and T2 pull node 2 apart: of u = 0 and u = 0.2 both are missed by 0.1, with T1 = 1, T2 = -1.
@@ -137,37 +118,33 @@ TEST_F(Iterate, FactorsOfOneThatMissTheConstraintsAreNoSuccess)
     json& item = document.at("ulf_stage_items").at(0);
     item.at("unknown").push_back({{"stage", "S1"}, {"case", "T2"}, {"pretension", true}});
     item.at("constraints").push_back("U02");
-    WriteText(m_file, document.dump());
-    const T_RUN run = Run("STAY", {"--json", "-"});
+    Write("m.json", document.dump());
+    const T_RUN run = Item("STAY --json r.json");
     EXPECT_EQ(1, run.code);
-    EXPECT_NE(std::string::npos, run.err.find("HOLD (S1/Last Step), U02")) << run.err;
-    const json r = json::parse(run.out);
-    EXPECT_EQ("constraints not met", r.at("status"));
-    EXPECT_NEAR(0.0, r.at("history").back().at("tolerance").get<double>(), 1e-9);
+    ExpectHolds(run.err, {"HOLD (S1/Last Step), U02"});
+    EXPECT_EQ("constraints not met", Result().at("status"));
+    EXPECT_NEAR(0.0, Result().at("history").back().at("tolerance"), 1e-9);
 }
 
 TEST_F(Iterate, SolvesOnceWhenNoIterationIsRequired)
 {
-    const T_RUN run = Run("STAY", {"--iterations", "0", "--json", "-"});
-    EXPECT_EQ(0, run.code) << run.err;
-    const json r = json::parse(run.out);
+    const json r = Json("ulf iterate m.json --item STAY --iterations 0");
     EXPECT_EQ("solved", r.at("status"));
-    EXPECT_EQ(1U, r.at("history").size());
-    EXPECT_EQ(1U, Blocks());
+    ExpectHistory(r, {{4.0, 3.0}});
     EXPECT_EQ((NAMES{"m.json", "m.ulf"}), m_folder.Names());
 }
 
 TEST_F(Iterate, StopsWhereACopyCannotBeWritten)
 {
     std::filesystem::create_directory(m_folder / "m_02.json");
-    const T_RUN run = Run("DOUBLE", {"--json", m_folder / "r.json"});
+    const T_RUN run = Item("DOUBLE --json r.json");
     EXPECT_EQ(4, run.code);
     EXPECT_EQ(1U, Lines(run.err).size()) << run.err;
-    EXPECT_NE(std::string::npos, run.err.find("m_02.json")) << run.err;
-    EXPECT_EQ(kStageCase, ReadText(m_file));
+    ExpectHolds(run.err, {"m_02.json"});
+    EXPECT_EQ(kStageCase, Text("m.json"));
     EXPECT_NEAR(2.0, Tension("m_01.json"), 1e-12) << "as after the iteration before";
-    EXPECT_EQ(2U, Blocks());
-    EXPECT_EQ(2U, json::parse(ReadText(m_folder / "r.json")).at("history").size());
+    EXPECT_EQ(2U, Blocks(Text("m.ulf")));
+    EXPECT_EQ(2U, Result().at("history").size());
     EXPECT_EQ((NAMES{"m.json", "m.ulf", "m_01.json", "m_02.json", "r.json"}), m_folder.Names());
 }
 
@@ -182,52 +159,34 @@ TEST_F(Iterate, InterruptedItEndsAfterACompleteIteration)
                  "timeout 10 cat m.ulf >> all; wait $pid; code=$?; kill $guard; exit $code",
                  m_folder.Path());
     EXPECT_EQ(1, run.code) << run.err;
-    EXPECT_NE(std::string::npos, run.err.find("cancelled")) << run.err;
-    const json r = json::parse(ReadText(m_folder / "r.json"));
-    EXPECT_EQ("cancelled", r.at("status"));
-    const std::size_t last = r.at("history").size() - 1;
+    ExpectHolds(run.err, {"cancelled"});
+    EXPECT_EQ("cancelled", Result().at("status"));
+    const std::size_t last = Result().at("history").size() - 1;
     ASSERT_GE(last, 1U);
     ASSERT_LT(last, 9U) << "it was not stopped by the interrupt";
-    const std::string report = ReadText(m_folder / "all");
-    EXPECT_EQ(last + 1, Count(report, "     Iteration = "));
-    EXPECT_TRUE(report.ends_with("===\n\n\n")) << "its last block is complete";
-    const std::string end = "m_0" + std::to_string(last) + ".json";
-    EXPECT_NEAR(std::pow(2.0, double(last)), Tension(end), 1e-9);
+    EXPECT_EQ(last + 1, Blocks(Text("all")));
+    EXPECT_TRUE(Text("all").ends_with("===\n\n\n")) << "its last block is complete";
+    EXPECT_NEAR(std::pow(2.0, double(last)), Tension("m_0" + std::to_string(last) + ".json"), 1e-9);
     EXPECT_FALSE(std::filesystem::exists(m_folder / ("m_0" + std::to_string(last + 1) + ".json")));
-    EXPECT_EQ(kStageCase, ReadText(m_file));
+    EXPECT_EQ(kStageCase, Text("m.json"));
 }
 
 TEST_F(Iterate, RefusesBeforeAnythingIsWritten)
 {
-    const struct {
-        std::string item;
-        std::vector<std::string> more;
-        int code;
-        const char* says;
-    } kRows[] = {
-        {"NONE", {}, 2, "NONE"},
-        {"STAY", {"--iterations", "100"}, 2, "0 to 99"},
-        {"STAY", {"--tolerance", "-1"}, 2, "tolerance"},
-        {"STAY", {"--plot", m_folder / "p.gif"}, 2, "picture"},
-    };
-    for (const auto& row : kRows) {
-        const T_RUN run = Run(row.item, row.more);
-        EXPECT_EQ(row.code, run.code) << row.says << run.err;
-        EXPECT_NE(std::string::npos, run.err.find(row.says)) << run.err;
-    }
+    ExpectRefused("ulf iterate m.json --item NONE", 2, "NONE");
+    ExpectRefused("ulf iterate m.json --item STAY --iterations 100", 2, "0 to 99");
+    ExpectRefused("ulf iterate m.json --item STAY --tolerance -1", 2, "tolerance");
+    ExpectRefused("ulf iterate m.json --item STAY --plot p.gif", 2, "picture");
     EXPECT_EQ(NAMES{"m.json"}, m_folder.Names());
 }
 
 #ifdef QM_UI
 TEST_F(Iterate, PictureHasTitleAxesAndLegend)
 {
-    const std::string svg = m_folder / "p.svg";
-    ASSERT_EQ(0, Run("STAY", {"--plot", svg}).code);
-    const std::string text = ReadText(svg);
-    for (const char* piece :
-         {"Iterative analysis for pretension: STAY", ">Iteration<", "Factor, tolerance (-)",
-          ">Tolerance<", ">Factor 1, S1/First Step T<", "convergence tolerance"})
-        EXPECT_NE(std::string::npos, text.find(piece)) << piece;
+    Done("ulf iterate m.json --item STAY --plot p.svg");
+    ExpectHolds(Text("p.svg"),
+                {"Iterative analysis for pretension: STAY", ">Iteration<", "Factor, tolerance (-)",
+                 ">Tolerance<", ">Factor 1, S1/First Step T<", "convergence tolerance"});
 }
 #endif
 

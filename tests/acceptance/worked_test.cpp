@@ -1,21 +1,17 @@
 // Published and hand-worked evaluations; docs/verification.md derives them.
 #include "program.h"
 
-#include <gtest/gtest.h>
-#include <nlohmann/json.hpp>
-
-#include <fstream>
-
 namespace {
 
-using json = nlohmann::json;
-
-json Results(const std::string& file)
-{
-    const T_RUN run = RunProgram({"evaluate", file, "--json", "-"});
-    EXPECT_LE(run.code, 1) << run.err;
-    return json::parse(run.out);
-}
+class Worked : public CProgramTest {
+protected:
+    json Results(const std::string& file) const
+    {
+        const T_RUN run = Run("evaluate " + file + " --json -");
+        EXPECT_LE(run.code, 1) << run.err;
+        return json::parse(run.out);
+    }
+};
 
 const json& Named(const json& results, const std::string& name)
 {
@@ -25,16 +21,11 @@ const json& Named(const json& results, const std::string& name)
     throw std::runtime_error("no evaluation " + name);
 }
 
-std::string WorkedCase(const char* name)
-{
-    return (ProjectFolder() / "tests/data/worked" / name).string();
-}
-
 // examples/first-steps/README.md, worked with a calculator. The program walks a demand curve with
 // periods 0.01 s apart, hence the last digit but one.
-TEST(Worked, FirstStepsAtc40ProcedureA)
+TEST_F(Worked, FirstStepsAtc40ProcedureA)
 {
-    const json all = Results(ExampleCase("first-steps"));
+    const json all = Results("@first-steps");
     const json& a = Named(all, "PX ATC-40 A");
     EXPECT_NEAR(1.285714, a.at("factors").at("gamma"), 5e-7);
     EXPECT_NEAR(0.857143, a.at("factors").at("alpha"), 5e-7);
@@ -58,9 +49,9 @@ TEST(Worked, FirstStepsAtc40ProcedureA)
     EXPECT_NEAR(0.0997, a.at("performance_point").at("D"), 5e-5);
 }
 
-TEST(Worked, FirstStepsTargetDisplacements)
+TEST_F(Worked, FirstStepsTargetDisplacements)
 {
-    const json all = Results(ExampleCase("first-steps"));
+    const json all = Results("@first-steps");
     const json& ec8 = Named(all, "PX EC8").at("target");
     EXPECT_NEAR(0.051333, ec8.at("dy"), 5e-7);
     EXPECT_NEAR(3.36 / 9.80665, ec8.at("ay"), 1e-6);
@@ -79,9 +70,9 @@ TEST(Worked, FirstStepsTargetDisplacements)
 }
 
 // N2 with dm* = dt* on a three-storey shear building, worked elsewhere with g = 9.80665.
-TEST(Worked, N2ShearBuilding)
+TEST_F(Worked, N2ShearBuilding)
 {
-    const json all = Results(WorkedCase("n2-shear-building.json"));
+    const json all = Results(QM_TEST_DATA "/worked/n2-shear-building.json");
     const json& r = all.at(0);
     EXPECT_NEAR(1.2619, r.at("factors").at("gamma"), 5e-5);
     const json& t = r.at("target");
@@ -95,9 +86,9 @@ TEST(Worked, N2ShearBuilding)
 
 // ATC-40 section 8.3.3.3, behaviour type C; docs/verification.md says where the differences from
 // the printed points (85.55 and 150.32 mm) come from: at most one per cent.
-TEST(Worked, Atc40ExampleTypeC)
+TEST_F(Worked, Atc40ExampleTypeC)
 {
-    const json all = Results(WorkedCase("atc40-example.json"));
+    const json all = Results(QM_TEST_DATA "/worked/atc40-example.json");
     // clang-format off
     const struct { const char* name; double SdMm, Sa; } kPrinted[] = {
         {"SB A", 85.55, 3.237}, {"SB B", 85.55, 3.237},
@@ -125,17 +116,14 @@ TEST(Worked, Atc40ExampleTypeC)
     EXPECT_NEAR(0.08535, t.at("Di"), 1e-5);
 }
 
-} // namespace
-
 // docs/verification-table.md is what the program prints about examples/verification, and no
 // difference from a reference is left unexplained.
-TEST(Worked, VerificationTableIsTheProgramsOwn)
+TEST_F(Worked, VerificationTableIsTheProgramsOwn)
 {
-    const T_RUN run = RunProgram({"verify", (ProjectFolder() / "examples/verification").string()});
-    EXPECT_EQ(0, run.code) << run.err;
-    std::ifstream file(ProjectFolder() / "docs/verification-table.md");
-    const std::string page((std::istreambuf_iterator<char>(file)), {});
+    const std::string page = ReadText(ProjectFolder() / "docs/verification-table.md");
     const auto table = page.find("| source |");
     ASSERT_NE(std::string::npos, table);
-    EXPECT_EQ(page.substr(table), run.out);
+    EXPECT_EQ(page.substr(table), Done("verify " QM_PROJECT "/examples/verification"));
 }
+
+} // namespace

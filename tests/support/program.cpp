@@ -1,16 +1,8 @@
 #include "program.h"
 
-#include <algorithm>
-#include <array>
-#include <fcntl.h>
-#include <gtest/gtest.h>
+#include <cstdlib>
 #include <sstream>
-#include <sys/prctl.h>
-#include <sys/resource.h>
 #include <sys/wait.h>
-#include <unistd.h>
-
-#include <linux/capability.h>
 
 namespace fs = std::filesystem;
 
@@ -49,68 +41,72 @@ const char* const kSmallCase = R"({
 
 namespace {
 
-void SendTo(const std::string& path, int descriptor)
+std::string WithExamples(std::string line)
 {
-    const int file = open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC, 0600);
-    if (file < 0 || dup2(file, descriptor) < 0) _exit(126);
-}
-
-/// In the child, before the program starts.
-void Prepare(const T_RUN_OPTIONS& o, const std::string& outPath, const std::string& errPath)
-{
-    SendTo(outPath, STDOUT_FILENO);
-    SendTo(errPath, STDERR_FILENO);
-    if (!o.folder.empty() && chdir(o.folder.c_str()) != 0) _exit(126);
-    if (o.fileSizeLimit > 0) {
-        const auto bytes = static_cast<rlim_t>(o.fileSizeLimit);
-        const rlimit limit{bytes, bytes};
-        if (setrlimit(RLIMIT_FSIZE, &limit) != 0) _exit(126);
+    for (auto at = line.find('@'); at != std::string::npos; at = line.find('@', at)) {
+        const std::size_t length = line.find_first_of(" ;", at) - at;
+        const std::string path = ExampleCase(line.substr(at + 1, length - 1));
+        line.replace(at, length, path);
+        at += path.size();
     }
-    // Without this right root, too, is held by the mode of files and folders.
-    if (o.obeyModes && geteuid() == 0 && prctl(PR_CAPBSET_DROP, CAP_DAC_OVERRIDE, 0, 0, 0) != 0)
-        _exit(126);
-}
-
-T_RUN Run(const std::string& file, const std::vector<std::string>& arguments,
-          const T_RUN_OPTIONS& options)
-{
-    const CTempFolder texts;
-    const std::string outPath = texts / "out", errPath = texts / "err";
-    std::vector<std::string> copies{file};
-    copies.insert(copies.end(), arguments.begin(), arguments.end());
-    std::vector<char*> argv;
-    for (std::string& text : copies)
-        argv.push_back(text.data());
-    argv.push_back(nullptr);
-
-    const pid_t child = fork();
-    if (child == 0) {
-        Prepare(options, outPath, errPath);
-        execv(file.c_str(), argv.data());
-        _exit(127);
-    }
-    int status = 0;
-    T_RUN run;
-    if (child > 0 && waitpid(child, &status, 0) == child && WIFEXITED(status))
-        run.code = WEXITSTATUS(status);
-    run.out = ReadText(outPath);
-    run.err = ReadText(errPath);
-    return run;
+    return line;
 }
 
 } // namespace
 
-T_RUN RunProgram(const std::vector<std::string>& arguments, const T_RUN_OPTIONS& options)
-{
-    return Run(QM_PROGRAM, arguments, options);
-}
-
 T_RUN RunShell(const std::string& line, const fs::path& folder)
 {
+    const CTempFolder texts;
     const std::string bin = fs::path(QM_PROGRAM).parent_path().string();
-    T_RUN_OPTIONS options;
-    options.folder = folder;
-    return Run("/bin/sh", {"-c", "PATH='" + bin + "':$PATH; " + line}, options);
+    const int status =
+        std::system(("cd '" + folder.string() + "' && PATH='" + bin + "':$PATH && { " +
+                     WithExamples(line) + " ; } >" + texts / "out" + " 2>" + texts / "err")
+                        .c_str());
+    return {WIFEXITED(status) ? WEXITSTATUS(status) : -1, ReadText(texts / "out"),
+            ReadText(texts / "err")};
+}
+
+T_RUN CProgramTest::Run(const std::string& arguments, const std::string& before) const
+{
+    return RunShell(before + "qm-rps " + arguments, m_folder.Path());
+}
+
+std::string CProgramTest::Done(const std::string& arguments) const
+{
+    const T_RUN run = Run(arguments);
+    EXPECT_EQ(0, run.code) << arguments << ": " << run.err;
+    return run.out;
+}
+
+json CProgramTest::Json(const std::string& arguments, int code) const
+{
+    const T_RUN run = Run(arguments + " --json -");
+    EXPECT_EQ(code, run.code) << arguments << ": " << run.err;
+    return json::parse(run.out);
+}
+
+std::string CProgramTest::ExpectRefused(const std::string& arguments, int code,
+                                        const std::string& says) const
+{
+    const T_RUN run = Run(arguments);
+    EXPECT_EQ(code, run.code) << arguments << ": " << run.err;
+    EXPECT_EQ("", run.out) << arguments;
+    EXPECT_EQ(1U, Lines(run.err).size()) << arguments << ": " << run.err;
+    EXPECT_NE(std::string::npos, run.err.find(says)) << arguments << ": " << run.err;
+    return run.err;
+}
+
+void ExpectHolds(const std::string& text, std::initializer_list<const char*> pieces)
+{
+    for (const char* piece : pieces)
+        EXPECT_NE(std::string::npos, text.find(piece)) << piece << " is not in " << text;
+}
+
+std::string With(std::string text, const std::string& from, const std::string& to)
+{
+    const auto at = text.find(from);
+    if (at == std::string::npos) throw std::logic_error("not in the text: " + from);
+    return text.replace(at, from.size(), to);
 }
 
 std::vector<std::string> Lines(const std::string& text)
@@ -130,12 +126,4 @@ fs::path ProjectFolder()
 std::string ExampleCase(const std::string& name)
 {
     return (ProjectFolder() / "examples" / name / "case.json").string();
-}
-
-std::string SmallCaseWith(const std::string& from, const std::string& to)
-{
-    std::string text = kSmallCase;
-    const auto at = text.find(from);
-    if (at == std::string::npos) throw std::logic_error("not in the small case: " + from);
-    return text.replace(at, from.size(), to);
 }
