@@ -32,7 +32,6 @@ public:
     std::vector<T_FINDING> Findings() const override;
     /// Checks, then stores the combination as one edit that can be undone. 0: refused.
     int OnOK() override;
-    int Key() const { return m_key; }
 
 private:
     struct T_PART {

@@ -22,15 +22,6 @@ constexpr const char* kRowViolated = "IDS_RPS_Error_code_9___The_load_factors_ar
 constexpr int kSolverFailed = 10;
 constexpr int kRelaxed = 9;
 
-int g_solverRunning = 0; // the documented switch behind IsSolverRunning
-
-struct T_RUNNING {
-    T_RUNNING() { g_solverRunning = 1; }
-    ~T_RUNNING() { g_solverRunning = 0; }
-    T_RUNNING(const T_RUNNING&) = delete;
-    T_RUNNING& operator=(const T_RUNNING&) = delete;
-};
-
 struct T_CODE_KEY {
     int code;
     const char* key;
@@ -152,11 +143,6 @@ COptDsgn::COptDsgn(IUlfResponse& staticSource, IUlfResponse* stageSource)
 {
 }
 
-int COptDsgn::IsSolverRunning()
-{
-    return g_solverRunning;
-}
-
 int COptDsgn::CheckProblem(const T_OPT_PROBLEM& problem, T_OPT_ANSWER& answer) const
 {
     if (problem.iobj < 1 || problem.iobj > 3) return Fail(answer, kUnknownObjective);
@@ -224,12 +210,7 @@ int COptDsgn::SolveExact(const T_OPT_PROBLEM& problem, T_OPT_ANSWER& answer)
 
 int COptDsgn::SolveOptimum(const T_OPT_PROBLEM& problem, T_OPT_ANSWER& answer)
 {
-    int solved = 0;
-    {
-        const T_RUNNING running;
-        solved = CallSolver(problem, answer);
-    }
-    if (!solved) answer.code = kSolverFailed;
+    if (!CallSolver(problem, answer)) answer.code = kSolverFailed;
     const auto* row = std::find_if(std::begin(kCodeKeys), std::end(kCodeKeys),
                                    [&](const T_CODE_KEY& c) { return c.code == answer.code; });
     if (row != std::end(kCodeKeys)) return Fail(answer, row->key);

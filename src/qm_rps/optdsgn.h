@@ -25,9 +25,6 @@ public:
     /// learn (coefficients, system, code) is filled in both cases.
     [[nodiscard]] int Run(const T_OPT_PROBLEM& problem, T_OPT_ANSWER& answer);
 
-    /// 1 while the numerical solver optimises, for code that must not touch the model meanwhile.
-    static int IsSolverRunning();
-
 private:
     [[nodiscard]] int CheckProblem(const T_OPT_PROBLEM& problem, T_OPT_ANSWER& answer) const;
     [[nodiscard]] int ReadRows(const T_OPT_PROBLEM& problem, std::vector<T_OPT_ROW>& rows,

@@ -40,11 +40,6 @@ void CPO_HingeSkcvTabDlg::OnEdited()
     m_data = MirroredComponent(m_data);
 }
 
-std::vector<const char*> CPO_HingeSkcvTabDlg::PageTitles() const
-{
-    return PageTitleKeys(m_data);
-}
-
 void CPO_HingeSkcvTabDlg::SetDefaultAlpha(HINGE_END end, const T_SIDES<double>& alpha1,
                                           const T_SIDES<double>& alpha2)
 {

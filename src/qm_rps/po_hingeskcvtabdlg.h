@@ -21,7 +21,6 @@ public:
     void OnEdited();
     /// The curve of a page, or null before Data2Dlg.
     T_SKEL_MULTI* Curve(HINGE_END end);
-    std::vector<const char*> PageTitles() const;
 
     /// Default stiffness reduction ratios: alpha1 and alpha2 for the positive and negative side.
     void SetDefaultAlpha(HINGE_END end, const T_SIDES<double>& alpha1,

@@ -33,11 +33,6 @@ void CPO_HingeSkcvTabEuroDlg::OnEdited()
     m_data = MirroredComponent(m_data);
 }
 
-std::vector<const char*> CPO_HingeSkcvTabEuroDlg::PageTitles() const
-{
-    return PageTitleKeys(m_data);
-}
-
 int CPO_HingeSkcvTabEuroDlg::OnMeasureRdo(HINGE_END end, SKEL_MEASURE measure)
 {
     T_SKEL_EC8* curve = Curve(end);

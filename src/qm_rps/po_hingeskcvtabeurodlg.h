@@ -24,7 +24,6 @@ public:
     void OnEdited();
     /// The curve of a page, or null before Data2Dlg.
     T_SKEL_EC8* Curve(HINGE_END end);
-    std::vector<const char*> PageTitles() const;
 
     /// Switches the measure of a page: ratios D/Dy against plastic deformations, by the yield
     /// deformation of each side. Values that were not edited since the last switch come back digit

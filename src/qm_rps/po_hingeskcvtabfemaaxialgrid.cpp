@@ -26,7 +26,7 @@ void CPO_HingeSkcvTabFemaAxialGrid::Dlg2Data(std::vector<T_SKEL_AXIAL>& curves,
 
 int CPO_HingeSkcvTabFemaAxialGrid::AddForce(double axial)
 {
-    if (!InRange(axial)) return 0;
+    if (!CheckFinite(axial)) return 0;
     if (Find(axial) >= 0) {
         Refuse("Axial Force %g already exists!", axial);
         return 0;
@@ -43,7 +43,7 @@ int CPO_HingeSkcvTabFemaAxialGrid::ChangeForce(double oldAxial, double axial)
         Refuse("Old Axial Force %g does not exist!", oldAxial);
         return 0;
     }
-    if (!InRange(axial)) return 0;
+    if (!CheckFinite(axial)) return 0;
     const int other = Find(axial);
     if (other >= 0 && other != at) {
         Refuse("Axial Force %g already exists!", axial);
@@ -78,10 +78,9 @@ int CPO_HingeSkcvTabFemaAxialGrid::Find(double axial) const
     return -1;
 }
 
-bool CPO_HingeSkcvTabFemaAxialGrid::InRange(double axial)
+bool CPO_HingeSkcvTabFemaAxialGrid::CheckFinite(double axial)
 {
-    const bool inside = !m_range || (m_range->first <= axial && axial <= m_range->second);
-    if (std::isfinite(axial) && inside) return true;
+    if (std::isfinite(axial)) return true;
     ShowMessage("IDS_RPS_PO_FEMA_AXIALFORE_OUTOFRANGE");
     return false;
 }

@@ -4,8 +4,6 @@
 #include "qm_base/mdialog.h"
 #include "qm_rps/hinge/hingelabels.h"
 
-#include <optional>
-
 class CPO_HingeSkcvTabFemaAxialGrid : public zql::frx::MDialog {
 public:
     T_HINGE_OWNER m_owner; // for the unit
@@ -23,10 +21,8 @@ public:
     void Dlg2Data(std::vector<T_SKEL_AXIAL>& curves, const T_SIDES<T_SKEL_SIDE>& fresh) const;
     const std::vector<T_ROW>& Rows() const { return m_rows; }
 
-    /// Forces outside [lowest, highest] are refused; without a call every finite force is taken.
-    void SetRange(double lowest, double highest) { m_range = std::pair(lowest, highest); }
-
-    /// 1 done; 0 refused with a message, the list as it was. Forces are compared exactly.
+    /// 1 done; 0 refused with a message, the list as it was. Forces are compared exactly; a new
+    /// one is finite.
     [[nodiscard]] int AddForce(double axial);
     [[nodiscard]] int ChangeForce(double oldAxial, double axial);
     [[nodiscard]] int RemoveForce(double axial);
@@ -37,11 +33,10 @@ public:
 
 private:
     int Find(double axial) const; // index or -1
-    bool InRange(double axial);
+    bool CheckFinite(double axial);
     void Sort();
     void Refuse(const char* literal, double axial);
 
     std::vector<T_SKEL_AXIAL> m_given;
     std::vector<T_ROW> m_rows;
-    std::optional<std::pair<double, double>> m_range;
 };

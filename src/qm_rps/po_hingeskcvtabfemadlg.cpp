@@ -1,7 +1,5 @@
 #include "qm_rps/po_hingeskcvtabfemadlg.h"
 
-#include "qm_base/msgfunction.h"
-#include "qm_base/textformat.h"
 #include "qm_rps/hinge/curvefindings.h"
 #include "qm_rps/hinge/hingemeasure.h"
 #include "qm_rps/hinge/hingemirror.h"
@@ -169,24 +167,11 @@ bool CPO_HingeSkcvTabFemaDlg::IsNeedIJTab(HINGE_COMPONENT c) const
     return m_components[Index(c)] && NeedsIJPages(*m_components[Index(c)]);
 }
 
-std::vector<const char*> CPO_HingeSkcvTabFemaDlg::PageTitles(HINGE_COMPONENT c) const
-{
-    const auto& component = m_components[Index(c)];
-    return component ? PageTitleKeys(*component) : std::vector<const char*>{};
-}
-
 void CPO_HingeSkcvTabFemaDlg::SetAutoCalcValue(HINGE_COMPONENT c, HINGE_END end,
                                                const T_SIDES<double>& yield)
 {
     T_SKEL_FEMA* curve = Curve(c, end);
     if (curve && curve->autoYield) SetOnAllSides(*curve, &T_SKEL_SIDE::yield, yield);
-}
-
-void CPO_HingeSkcvTabFemaDlg::SetYieldDeform(HINGE_COMPONENT c, HINGE_END end,
-                                             const T_SIDES<double>& deform)
-{
-    if (T_SKEL_FEMA* curve = Curve(c, end))
-        SetOnAllSides(*curve, &T_SKEL_SIDE::yieldDeform, deform);
 }
 
 int CPO_HingeSkcvTabFemaDlg::OnComplianceChk(HINGE_COMPONENT c, HINGE_END end, bool on)
@@ -195,12 +180,6 @@ int CPO_HingeSkcvTabFemaDlg::OnComplianceChk(HINGE_COMPONENT c, HINGE_END end, b
     if (!curve) return 0;
     curve->compliance = on;
     return 1;
-}
-
-std::string CPO_HingeSkcvTabFemaDlg::CriterionText(const T_SKEL_FEMA& curve, double value)
-{
-    return curve.compliance ? ShortestText(value)
-                            : zql::lib::MMSGFunction::GetValue("IDS_RPS_PO_FEMA_Inactive");
 }
 
 bool CPO_HingeSkcvTabFemaDlg::IsInfillStrutMode(HINGE_COMPONENT c, HINGE_END end)

@@ -62,19 +62,13 @@ public:
 
     /// Separate pages for I-end and J-end.
     bool IsNeedIJTab(HINGE_COMPONENT c) const;
-    /// Keys of the page titles, one or two; none for a component that is not edited.
-    std::vector<const char*> PageTitles(HINGE_COMPONENT c) const;
 
     /// Yield strengths from section and material: taken only while they are automatic.
     void SetAutoCalcValue(HINGE_COMPONENT c, HINGE_END end, const T_SIDES<double>& yield);
-    /// Yield deformations of both sides, magnitudes.
-    void SetYieldDeform(HINGE_COMPONENT c, HINGE_END end, const T_SIDES<double>& deform);
 
     /// The switch "IDS_RPS_PO_FEMA_Compliance_Criteria". Off: the criteria keep their values, but
     /// are not checked and shown as inactive. 0: no such page.
     [[nodiscard]] int OnComplianceChk(HINGE_COMPONENT c, HINGE_END end, bool on);
-    /// A criterion as shown.
-    static std::string CriterionText(const T_SKEL_FEMA& curve, double value);
 
     /// Infill panel as a strut: the curve has its own labels.
     bool IsInfillStrutMode(HINGE_COMPONENT c, HINGE_END end);

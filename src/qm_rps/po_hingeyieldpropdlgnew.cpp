@@ -1,8 +1,5 @@
 #include "qm_rps/po_hingeyieldpropdlgnew.h"
 
-#include <algorithm>
-#include <cmath>
-
 std::vector<T_FINDING> CPO_HingeYieldPropDlgNew::Findings() const
 {
     return YieldSurfaceFindings(m_surface, m_type);
@@ -38,10 +35,4 @@ std::string CPO_HingeYieldPropDlgNew::AxisNoteKey(bool aboutY) const
 {
     if (aboutY) return m_surface.yield.y.used ? "" : "IDS_RPS_PO_Y_AXIS_NOT_USED";
     return m_surface.yield.z.used ? "" : "IDS_RPS_PO_Z_AXIS_NOT_USED";
-}
-
-double CPO_HingeYieldPropDlgNew::MomentNormaliser(const T_YIELD_LEVEL& level)
-{
-    return std::max({std::fabs(level.y.momentMax.pos), std::fabs(level.y.momentMax.neg),
-                     std::fabs(level.z.momentMax.pos), std::fabs(level.z.momentMax.neg)});
 }

@@ -49,8 +49,6 @@ public:
 
     /// Key of the note in place of an axis that is not used; empty where it is used.
     std::string AxisNoteKey(bool aboutY) const;
-    /// Largest of the four largest moments of a level.
-    static double MomentNormaliser(const T_YIELD_LEVEL& level);
 
 private:
     SKEL_TYPE m_type;

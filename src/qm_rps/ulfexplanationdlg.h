@@ -14,7 +14,6 @@ public:
     }
 
     const std::string& Item() const { return m_item; }
-    const T_ULF_EXPLAINED& Explained() const { return m_explained; }
     /// All of it in words, a paragraph for each statement.
     std::string Text() const
     {

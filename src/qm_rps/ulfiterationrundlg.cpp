@@ -229,7 +229,6 @@ int CUlfIterationRunDlg::Start()
     CUlfIteration run(host, *this, Settings());
     const int done = run.Run();
     m_result = host.Result();
-    m_report = run.ReportPath();
     const ULF_ITER_END end = run.End();
     if (end == ULF_ITER_END::NotSolved || end == ULF_ITER_END::ReportNotWritten)
         ShowMessage(run.Said()->messageKey, run.Said()->text);

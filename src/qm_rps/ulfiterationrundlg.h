@@ -58,7 +58,6 @@ public:
     std::string RowText(std::size_t row, std::size_t column) const;
     /// Shows the window of the latest solution's result. 0: there is none.
     [[nodiscard]] int OnShowResult();
-    std::string ReportPath() const { return m_report; }
 
 private:
     void Solved(const T_ULF_ITER_STEP& step, const std::optional<T_FINDING>& said) override;
@@ -80,5 +79,5 @@ private:
     bool m_running = false, m_cancel = false;
     std::vector<T_ULF_ITER_STEP> m_history;
     std::optional<T_ULF_RESULT> m_result; // of the latest solution
-    std::string m_status, m_report;
+    std::string m_status;
 };

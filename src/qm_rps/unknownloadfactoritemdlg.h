@@ -24,7 +24,6 @@ public:
     /// Checks, then writes. 0: a message was shown, `item` as it was.
     [[nodiscard]] int Dlg2Data(T_ULFI_D& item);
 
-    int Combination() const { return m_combination; }
     /// Another combination: its load cases; flags and weights of cases that both have stay.
     void OnSelChangeCombination(int key);
     /// The combinations of the model as a list: names, the chosen one (-1: it is gone), a choice.

@@ -6,30 +6,6 @@
 
 #include <algorithm>
 
-namespace {
-
-struct T_CODE_PAIR {
-    const char *concrete, *steel;
-    YIELD_CODE code;
-};
-constexpr T_CODE_PAIR kPairs[] = {
-    {"Eurocode2", "Eurocode3", YIELD_CODE::Eurocode},
-    {"Eurocode2", "Eurocode3:05", YIELD_CODE::Eurocode},
-    {"Eurocode2:04", "Eurocode3", YIELD_CODE::Eurocode},
-    {"Eurocode2:04", "Eurocode3:05", YIELD_CODE::Eurocode},
-    {"AIJ-WSD99", "AIJ-ASD02", YIELD_CODE::Aij},
-};
-
-} // namespace
-
-YIELD_CODE CYieldStrengthCalcOptDlg::CodeOf(std::string_view concreteCode,
-                                            std::string_view steelCode)
-{
-    for (const T_CODE_PAIR& p : kPairs)
-        if (concreteCode == p.concrete && steelCode == p.steel) return p.code;
-    return YIELD_CODE::General;
-}
-
 int CYieldStrengthCalcOptDlg::OnSelectElemChk(bool on,
                                               const std::vector<T_SELECTED_ELEM>& selection)
 {

@@ -4,9 +4,6 @@
 #include "qm_rps/yieldstrengthcalcoptmatdescdlg.h"
 
 #include <string>
-#include <string_view>
-
-enum class YIELD_CODE { General, Eurocode, Aij };
 
 struct T_YIELD_CALC_OPT {
     bool selectedOnly = false; // calculate for the selected elements alone
@@ -27,10 +24,6 @@ public:
         : m_element(element)
     {
     }
-
-    /// Eurocode: concrete "Eurocode2" or "Eurocode2:04" with steel "Eurocode3" or "Eurocode3:05".
-    /// AIJ: "AIJ-WSD99" with "AIJ-ASD02". Any other pair: general. Exact spelling.
-    static YIELD_CODE CodeOf(std::string_view concreteCode, std::string_view steelCode);
 
     static constexpr const char* kTitleKey = "IDS_DB_DT_YSCO";
 

@@ -176,12 +176,11 @@ TEST(HingeFemaCurve, WritesSymmetricCurvesMirrored)
     EXPECT_EQ(100, n.yield);
 }
 
-TEST(HingeAxialForces, RefusesTheSameTheMissingAndTheOutlying)
+TEST(HingeAxialForces, RefusesTheSameAndTheMissing)
 {
     F f = ValidBackbone<F>();
     CPO_HingeSkcvTabFemaAxialGrid grid;
     grid.Data2Dlg({{-100, f.sides}, {200, {}}});
-    grid.SetRange(-500, 1000);
     EXPECT_EQ(0, grid.AddForce(200));
     EXPECT_EQ("Axial Force 200 already exists!", grid.Messages().back().text);
     EXPECT_EQ(0, grid.RemoveForce(1.5));
@@ -189,10 +188,8 @@ TEST(HingeAxialForces, RefusesTheSameTheMissingAndTheOutlying)
     EXPECT_EQ("Old Axial Force 3 does not exist!", grid.Messages().back().text);
     EXPECT_EQ(0, grid.ChangeForce(-100, 200));
     EXPECT_EQ("Axial Force 200 already exists!", grid.Messages().back().text);
-    for (double force : {1000.5, -500.5, kNan}) {
-        EXPECT_EQ(0, grid.AddForce(force));
-        EXPECT_EQ("IDS_RPS_PO_FEMA_AXIALFORE_OUTOFRANGE", grid.Messages().back().key);
-    }
+    EXPECT_EQ(0, grid.AddForce(kNan));
+    EXPECT_EQ("IDS_RPS_PO_FEMA_AXIALFORE_OUTOFRANGE", grid.Messages().back().key);
     EXPECT_EQ(1, grid.AddForce(1000));
     EXPECT_EQ(1, grid.AddForce(-500));
     EXPECT_EQ(1, grid.ChangeForce(-100, 300)); // its curve moves with it

@@ -101,16 +101,6 @@ TEST(HingeTypeMode, FollowsElementDefinitionAndInteraction)
     EXPECT_FALSE(HasComponent(HINGE_ELEMENT::Truss, C::My));
 }
 
-TEST(HingeTypeLabels, NameTheModelOfABendingComponent)
-{
-    const auto label = HingeModelLabel;
-    EXPECT_EQ("Moment - Rotation (M-Ry)", label(HINGE_DEFINITION::MomentRotation, C::My));
-    EXPECT_EQ("Moment - Curvature (M-Rz Lumped)", label(HINGE_DEFINITION::CurvatureLumped, C::Mz));
-    EXPECT_EQ("Moment - Curvature (M-Rx Distributed)",
-              label(HINGE_DEFINITION::CurvatureDistributed, C::Mx));
-    EXPECT_EQ("", label(HINGE_DEFINITION::MomentRotation, C::Fz));
-}
-
 // By hand: E = 260, G = 100, L = 2; A = 6, Asy = 5, Asz = 4, J = 3, Iyy = 2 (0.5 at I), Izz = 7.
 TEST(HingeTypeStiffness, ComesFromSectionMaterialAndLength)
 {

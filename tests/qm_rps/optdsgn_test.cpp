@@ -145,8 +145,6 @@ TEST_F(OptDsgn, HandsEqualitiesFirstAndEveryInequalityAsAtMost)
     EXPECT_EQ(std::vector<int>({1, 5, 2, 2, 3, 1}),
               std::vector<int>({m_handed.mode, m_handed.ncon, m_handed.nvar, m_handed.neq,
                                 m_handed.iobj, m_handed.isign}));
-    EXPECT_EQ(1, m_handed.running);
-    EXPECT_EQ(0, COptDsgn::IsSolverRunning());
 }
 
 TEST_F(OptDsgn, KnownCaseChangesOnlyTheRightHandSide)
@@ -326,7 +324,6 @@ TEST_F(OptDsgn, ExactModeIgnoresTheReturnAndChecksSigns)
     for (const auto& c : kCases) {
         const int result = Run(Problem(rows, c.isign, false), Answering(m_handed, c.x, 5, 0));
         EXPECT_EQ(0, m_handed.mode);
-        EXPECT_EQ(0, m_handed.running);
         EXPECT_EQ(c.key, m_answer.key);
         EXPECT_EQ(m_answer.key.empty() ? 1 : 0, result);
         if (c.number) {
@@ -346,7 +343,6 @@ TEST_F(OptDsgn, SurvivesASolverThatThrows)
     EXPECT_EQ(kNoSolution, m_answer.key);
     EXPECT_EQ(10, m_answer.code);
     ASSERT_EQ(1u, CAppBase::TakeAssertions_ST().size());
-    EXPECT_EQ(0, COptDsgn::IsSolverRunning());
 }
 
 TEST_F(OptDsgn, RefusesWhatItCannotHandOver)

@@ -161,18 +161,6 @@ TEST(YieldPropGrid, ShowsRatiosOrValuesAndStoresRatios)
     EXPECT_EQ(0, grid.SetCellText(1, 3, "3")) << "a value without a scale has no ratio";
 }
 
-TEST(YieldStrengthCalcOpt, CodePairsFixTheMode)
-{
-    using E = YIELD_CODE;
-    const auto code = [](const char* concrete, const char* steel) {
-        return CYieldStrengthCalcOptDlg::CodeOf(concrete, steel);
-    };
-    EXPECT_EQ(E::Eurocode, code("Eurocode2", "Eurocode3:05"));
-    EXPECT_EQ(E::Eurocode, code("Eurocode2:04", "Eurocode3"));
-    EXPECT_EQ(E::Aij, code("AIJ-WSD99", "AIJ-ASD02"));
-    EXPECT_EQ(E::General, code("Eurocode2:04", "AIJ-ASD02"));
-}
-
 TEST(YieldStrengthCalcOpt, RefusesASelectionOfAnotherKind)
 {
     CYieldStrengthCalcOptDlg dlg(HINGE_ELEMENT::BeamColumn);

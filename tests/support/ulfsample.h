@@ -32,7 +32,6 @@ public:
 struct T_HANDED {
     int calls = 0, mode = -1, ncon = 0, nvar = 0, neq = 0, iobj = 0, isign = 0;
     std::vector<double> matrix, rhs, weights;
-    int running = -1; // COptDsgn::IsSolverRunning while it ran
 };
 
 /// Keeps its arguments in `handed` and answers with the factors, the code and the return value.
@@ -45,17 +44,8 @@ inline COptDsgn::Solver Answering(T_HANDED& handed, std::vector<double> factors,
         const auto list = [](std::span<const double> v) {
             return std::vector<double>(v.begin(), v.end());
         };
-        handed = {handed.calls + 1,
-                  mode,
-                  ncon,
-                  nvar,
-                  neq,
-                  iobj,
-                  isign,
-                  list(matrix),
-                  list(rhs),
-                  list(weights),
-                  COptDsgn::IsSolverRunning()};
+        handed = {handed.calls + 1, mode,      ncon,         nvar, neq, iobj, isign,
+                  list(matrix),     list(rhs), list(weights)};
         std::copy(factors.begin(), factors.end(), x.begin());
         out = code;
         return result;

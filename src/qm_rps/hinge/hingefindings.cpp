@@ -50,11 +50,3 @@ const char* PageTitleKey(const T_HINGE_COMPONENT& c, HINGE_END end)
     return c.location == HINGE_LOCATION::BothEnds ? "IDS_RPS_PO_DOF_PropertiesIJ"
                                                   : "IDS_RPS_PO_DOF_Properties";
 }
-
-std::vector<const char*> PageTitleKeys(const T_HINGE_COMPONENT& c)
-{
-    std::vector<const char*> titles;
-    ForEachPage(
-        c, [&](HINGE_END end, const T_SKEL_CURVE&) { titles.push_back(PageTitleKey(c, end)); });
-    return titles;
-}

@@ -135,8 +135,5 @@ void ForEachPage(COMPONENT& c, USE use)
     use(end, jEnd && !c.sameEnds ? c.curves.J : c.curves.I);
 }
 
-/// Keys of the titles of a component's pages, one or two.
-std::vector<const char*> PageTitleKeys(const T_HINGE_COMPONENT& c);
-
 /// Key of the title of a component's page: I-end, J-end, both ends alike, or plain.
 const char* PageTitleKey(const T_HINGE_COMPONENT& c, HINGE_END end);

@@ -31,9 +31,3 @@ std::vector<std::string> StiffnessTexts(HINGE_COMPONENT c);
 /// Position of an option in that list; -1: the component has no such. Of Fx and Mx every option
 /// but user is the elastic stiffness.
 int StiffnessPosition(HINGE_COMPONENT c, INIT_STIFFNESS option);
-
-/// "Moment - Rotation (M-%s)", "Moment - Curvature (M-%s Lumped)" or "... Distributed)" with the
-/// component's rotation symbol Rx, Ry or Rz; empty for a force.
-std::string HingeModelLabel(HINGE_DEFINITION definition, HINGE_COMPONENT c);
-/// Key of the name of a hinge length.
-const char* HingeLengthCaptionKey(bool altHysteresis);

@@ -201,11 +201,3 @@ int BackboneOf(const T_SKEL_CURVE& curve, SKEL_TYPE type, T_HINGE_PREVIEW& out)
     out = ok ? p : T_HINGE_PREVIEW();
     return ok ? 1 : 0;
 }
-
-int PreviewOf(const T_SKEL_CURVE& curve, SKEL_TYPE type, T_HINGE_PREVIEW& out)
-{
-    if (!BackboneOf(curve, type, out)) return 0;
-    AdjustEndPoint(out.line);
-    AdjustEndPoint(out.line);
-    return 1;
-}

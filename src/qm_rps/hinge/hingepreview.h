@@ -30,6 +30,3 @@ void AdjustEndPoint(std::vector<T_PREVIEW_POINT>& line);
 /// Backbone and criteria of a curve, ends not extended. 1 done; 0 when the curve has no shape yet
 /// (strengths of a trilinear curve not known, values not finite); out is then empty.
 [[nodiscard]] int BackboneOf(const T_SKEL_CURVE& curve, SKEL_TYPE type, T_HINGE_PREVIEW& out);
-
-/// BackboneOf with both ends extended for the small preview box of the editors.
-[[nodiscard]] int PreviewOf(const T_SKEL_CURVE& curve, SKEL_TYPE type, T_HINGE_PREVIEW& out);
