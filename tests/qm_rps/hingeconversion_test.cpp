@@ -79,10 +79,8 @@ TEST(HingeConversion, SwitchesThereAndBackWithoutLosingADigit)
 {
     F f = ValidBackbone<F>();
     f.sides.pos.C.deform = 1.0000000012345678; // its plastic part keeps few digits
-    f.sides.pos.CP = 17.0 / 3.0;
-    f.sides.neg.yieldDeform = 0; // makes every value of the side 0
+    f.sides.neg.yieldDeform = 0;               // makes every value of the side 0
     f.curves = {{-50, f.sides}, {80, f.sides}};
-    f.curves[1].sides.pos.E.deform = 9.123456789012345;
     D dlg;
     ASSERT_EQ(1, dlg.Data2Dlg(kMy, ComponentWith(SKEL_TYPE::Fema, f)));
     F& edited = *dlg.Curve(kMy, HINGE_END::Both);
@@ -93,8 +91,9 @@ TEST(HingeConversion, SwitchesThereAndBackWithoutLosingADigit)
     ASSERT_EQ(1, dlg.OnMeasureRdo(kMy, HINGE_END::Both, SKEL_MEASURE::Plastic));
     edited.sides.pos.LS = 0.05; // edited in between: converted, the others come back
     ASSERT_EQ(1, dlg.OnMeasureRdo(kMy, HINGE_END::Both, SKEL_MEASURE::DDy));
+    f.sides.pos.LS = edited.sides.pos.LS;
     EXPECT_NEAR(6, edited.sides.pos.LS, 1e-14);
-    EXPECT_EQ(17.0 / 3.0, edited.sides.pos.CP);
+    EXPECT_EQ(f, edited);
 }
 
 } // namespace

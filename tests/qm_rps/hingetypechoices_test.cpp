@@ -1,18 +1,12 @@
 // What the hinge type editor offers and what its buttons do.
 #include "hingesample.h"
-#include "qm_rps/po_hingeintegrationpointdlg.h"
-#include "qm_rps/po_hingelengthmthetadlg.h"
-#include "qm_rps/po_hingemasonrydlg.h"
 #include "qm_rps/po_hingetypedlg.h"
-#include "qm_rps/po_hingeyieldpropdlgnew.h"
 
-#include <functional>
 #include <gtest/gtest.h>
 
 namespace {
 
 using C = HINGE_COMPONENT;
-using P = HINGE_PART;
 
 T_HINGE_CONTEXT Context()
 {
@@ -29,19 +23,6 @@ T_HINGE_CONTEXT Context()
         T_TABLE<T_SECT_D>{{1, values}, {4, wall}, {7, circle}}, T_TABLE<T_MATL_D>{{1, m}});
     return x;
 }
-
-/// Edits the child dialog and accepts it.
-class CEditView : public zql::frx::IDialogView {
-public:
-    std::function<void(zql::frx::MDialog&)> m_edit;
-    void ShowMessage(const std::string&, const std::string&) override {}
-    bool AskYesNo(const std::string&, const std::string&) override { return false; }
-    int RunModal(zql::frx::MDialog& child) override
-    {
-        if (m_edit) m_edit(child);
-        return m_edit ? 1 : 0;
-    }
-};
 
 std::string Keys(const CPO_HingeTypeDlg::T_REF_LIST& list)
 {
@@ -124,14 +105,13 @@ TEST(HingeTypeStiffness, ComesFromSectionMaterialAndLength)
     };
     const auto all = rows(2);
     ASSERT_EQ(7u, all.size());
-    EXPECT_DOUBLE_EQ(780, *all[0].stiffness.pos);   // E A / L
-    EXPECT_DOUBLE_EQ(500, *all[1].stiffness.pos);   // G Asy
-    EXPECT_FALSE(all[2].stiffness.pos.has_value()); // no bending stiffness of a shear
-    EXPECT_DOUBLE_EQ(150, *all[3].stiffness.neg);   // G J / L
-    EXPECT_DOUBLE_EQ(390, *all[4].stiffness.pos);   // 3 E 0.5 Iyy / L at the I-end
-    EXPECT_DOUBLE_EQ(780, *all[5].stiffness.pos);   // at the J-end
-    EXPECT_EQ(11, *all[6].stiffness.pos);
-    EXPECT_EQ(12, *all[6].stiffness.neg);
+    EXPECT_DOUBLE_EQ(780, *all[0].stiffness.pos); // E A / L
+    EXPECT_DOUBLE_EQ(500, *all[1].stiffness.pos); // G Asy
+    EXPECT_FALSE(all[2].stiffness.pos);           // no bending stiffness of a shear
+    EXPECT_DOUBLE_EQ(150, *all[3].stiffness.neg); // G J / L
+    EXPECT_DOUBLE_EQ(390, *all[4].stiffness.pos); // 3 E 0.5 Iyy / L at the I-end
+    EXPECT_DOUBLE_EQ(780, *all[5].stiffness.pos); // at the J-end
+    EXPECT_EQ(12, *all[6].stiffness.neg);         // entered
     t.length.autoSpan = false, t.length.span = 4;
     EXPECT_DOUBLE_EQ(195, *rows(2)[4].stiffness.pos);
     t.length.autoSpan = true;
@@ -153,75 +133,22 @@ TEST(HingeTypeDefaults, PutActiveComponentsBack)
     const auto& now = dlg.Type().components;
     EXPECT_EQ(SKEL_TYPE::Bilinear, now[0].type);
     EXPECT_EQ(HINGE_LOCATION::Center, now[0].location);
-    EXPECT_EQ(INIT_STIFFNESS::Elastic, std::get<T_SKEL_MULTI>(now[0].curves.I).initStiffness);
-    EXPECT_TRUE(now[4].active);
     EXPECT_EQ(HINGE_LOCATION::BothEnds, now[4].location);
     EXPECT_EQ(INIT_STIFFNESS::EI6L, std::get<T_SKEL_MULTI>(now[4].curves.J).initStiffness);
     EXPECT_EQ(t.components[5], now[5]);
 }
 
-TEST(HingeTypeButtons, TakeWhatIsAcceptedAlone)
+TEST(HingeTypeLengths, AreShownWhereTheCurveNeedsThem)
 {
-    CEditView view;
-    CPO_HingeTypeDlg dlg({});
-    dlg.SetView(&view);
-    const T_PHGT_D before = dlg.Type();
-    EXPECT_EQ(0, dlg.OnYieldSurfaceDlgDlg() + dlg.OnUserInteractionDlg() + dlg.OnMasonryPropDlg() +
-                     dlg.OnBtnIntegrationPoint() + dlg.OnBtnHingeLength()); // cancelled
-    view.m_edit = [](zql::frx::MDialog&) {};
-    EXPECT_EQ(0, dlg.OnYieldSurfaceDlgDlg()); // zeros are no surface
-    EXPECT_EQ(0, dlg.OnMasonryPropDlg());
-    EXPECT_EQ(before, dlg.Type());
-
-    view.m_edit = [](zql::frx::MDialog& d) {
-        auto& surface = dynamic_cast<CPO_HingeYieldPropDlgNew&>(d).m_surface;
-        surface.yield.tension = 3, surface.yield.compression = 9;
-        surface.yield.y.used = surface.yield.z.used = false;
-    };
-    EXPECT_EQ(1, dlg.OnYieldSurfaceDlgDlg());
-    EXPECT_EQ(9, dlg.Type().yieldSurface->yield.compression);
-    view.m_edit = [](zql::frx::MDialog& d) {
-        dynamic_cast<CPO_HingeMasonryDlg&>(d).m_masonry = {2, 5, 1, 0, 0.5};
-    };
-    EXPECT_EQ(1, dlg.OnMasonryPropDlg());
-    EXPECT_EQ(5, dlg.Type().masonry->compStrength);
-    view.m_edit = [](zql::frx::MDialog& d) {
-        EXPECT_EQ(1, dynamic_cast<CPO_HingeIntegrationPointDlg&>(d).OnSelect(4));
-    };
-    EXPECT_EQ(1, dlg.OnBtnIntegrationPoint());
-    EXPECT_EQ(7, dlg.Type().length.integrationPoints);
-    view.m_edit = [](zql::frx::MDialog& d) {
-        dynamic_cast<CPO_HingeLengthMThetaDlg&>(d).m_My = {0.3, 0.25};
-    };
-    EXPECT_EQ(1, dlg.OnBtnHingeLength());
-    EXPECT_EQ("", dlg.GetHingeLength_MTheta(C::My)); // needed by the EC8 curve alone
-    T_PHGT_D t = dlg.Type();
-    t.components[4] = ComponentWith(SKEL_TYPE::Ec8, ValidBackbone<T_SKEL_EC8>());
+    T_PHGT_D t;
+    t.length.My = {0.3, 0.25};
     t.length.components.J[4] = 0.5;
+    CPO_HingeTypeDlg dlg({});
+    dlg.Data2Dlg(t);
+    EXPECT_EQ("", dlg.GetHingeLength_MTheta(C::My)); // needed by the EC8 curve alone
+    t.components[4] = ComponentWith(SKEL_TYPE::Ec8, ValidBackbone<T_SKEL_EC8>());
     t.components[4].location = HINGE_LOCATION::JEnd;
     dlg.Data2Dlg(t);
     EXPECT_EQ("J 0.25", dlg.GetHingeLength_MTheta(C::My));
     EXPECT_EQ("J 0.5", dlg.GetHingeLength_MPhi(C::My));
-}
-
-TEST(HingeTypeApply, StoresATypeThatPasses)
-{
-    T_PHGT_D stored;
-    CPO_HingeTypeDlg dlg({});
-    EXPECT_EQ(0, dlg.OnApply()); // no name
-    dlg.Edited().name = "beam";
-    EXPECT_EQ(0, dlg.OnApply()); // nowhere to store
-    dlg.m_store = [&](const T_PHGT_D& t) {
-        stored = t;
-        return 1;
-    };
-    EXPECT_EQ(1, dlg.OnOK());
-    EXPECT_EQ("beam", stored.name);
-
-    T_SKEL_MULTI steep;
-    steep.sides.pos.alpha1 = 2;
-    stored.components[1] = stored.components[2] = ComponentWith(SKEL_TYPE::Bilinear, steep);
-    dlg.Data2Dlg(stored);
-    EXPECT_EQ(1, dlg.OnApply());
-    EXPECT_EQ("IDS_RPS_PO_MULTI_WARNING_ALPHA", dlg.Messages().back().key);
 }

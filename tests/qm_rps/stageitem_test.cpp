@@ -1,14 +1,11 @@
-#include "qm_base/messagehistory.h"
-#include "qm_rps/factors/ulfexplain.h"
 #include "qm_rps/unknownloadfactorconstraintdlg.h"
 #include "qm_rps/unknownloadfactordlg.h"
-#include "qm_rps/unknownloadfactorresultdlg.h"
 #include "qm_rps/unknownstageitemdlg.h"
 #include "qm_rps/unknowntabletabgrid1.h"
+#include "scriptview.h"
 #include "twotrusses.h"
 
 #include <gtest/gtest.h>
-#include <random>
 
 namespace {
 
@@ -26,28 +23,6 @@ protected:
     CDBDoc m_doc;
     std::optional<CUnknownStageItemDlg> m_dialog;
 };
-
-/// Gives an item dialog a name and accepts it.
-class CNamer : public zql::frx::IDialogView {
-public:
-    std::string m_name;
-    void ShowMessage(const std::string&, const std::string&) override {}
-    bool AskYesNo(const std::string&, const std::string&) override { return false; }
-    int RunModal(zql::frx::MDialog& child) override
-    {
-        auto* item = dynamic_cast<CUlfItemDialog*>(&child);
-        if (item) item->m_name = m_name;
-        return item ? child.OnOK() : 0;
-    }
-};
-
-std::string TextAt(const T_SHEET& sheet, std::size_t row, std::size_t column)
-{
-    const auto it = sheet.cells.find({row, column});
-    const auto* text =
-        it == sheet.cells.end() ? nullptr : std::get_if<std::string>(&it->second.value);
-    return text ? *text : std::string();
-}
 
 } // namespace
 
@@ -77,34 +52,6 @@ TEST_F(StageItem, ResultHasARowForEachLoadWithStageAndStep)
     EXPECT_TRUE(row.met && row.active);
 }
 
-TEST_F(StageItem, SheetHasStageAndStepInItsHeadings)
-{
-    T_MODEL_CONTENT content = two::Content();
-    content.model.ulfConstraints[1].stage = 1;
-    Open(std::move(content));
-    ASSERT_EQ(1, m_dialog->OnCalculate());
-    T_SHEET sheet;
-    ASSERT_EQ(1, MakeUlfSheet(*m_dialog->Result(), {}, sheet));
-    EXPECT_EQ("HOLD (S1/Last Step)", TextAt(sheet, 7, 2));
-    EXPECT_EQ("S1/First Step T", TextAt(sheet, 11, 0));
-    EXPECT_EQ("S1/First Step G", TextAt(sheet, 12, 0));
-    EXPECT_EQ("=SUMPRODUCT(B12:B13,C12:C13)",
-              std::get<T_SHEET_FORMULA>(sheet.cells.at({10, 2}).value).text);
-}
-
-TEST_F(StageItem, HasNoLoadCombination)
-{
-    Open(two::Content());
-    ASSERT_EQ(1, m_dialog->OnCalculate());
-    CUnknownLoadFactorResultDlg dialog(m_doc, *m_dialog->Result());
-    EXPECT_STREQ("IDS_RPS_GXGRID_Stage", dialog.FactorHeads()[0]);
-    dialog.m_combinationName = "NEW";
-    (void)TakeMessageHistory();
-    EXPECT_EQ(0, dialog.OnMakeCombination());
-    EXPECT_NE(std::string::npos, TakeMessageHistory().at(0).find("iterat"));
-    EXPECT_TRUE(m_doc.Data().Model().combinations.empty());
-}
-
 TEST_F(StageItem, GroupOneReadsTheDeadLoadToo)
 {
     T_MODEL_CONTENT content = two::Content();
@@ -122,31 +69,6 @@ TEST_F(StageItem, GroupOneReadsTheDeadLoadToo)
         m_dialog->Summary());
 }
 
-TEST_F(StageItem, ExplainsAContradictionAndASignByItsRow)
-{
-    T_MODEL_CONTENT content = two::Content();
-    content.model.ulfConstraints[2] = content.model.ulfConstraints[1];
-    content.model.ulfConstraints[2].name = "LOOSE";
-    content.model.ulfConstraints[2].value = 0.1;
-    content.model.ulfStageItems[1].constraints.push_back("LOOSE");
-    Open(std::move(content));
-    EXPECT_EQ(0, m_dialog->OnCalculate());
-    T_ULF_EXPLAINED e;
-    ASSERT_EQ(1, ExplainUlf(*m_dialog->Calculation().run, m_doc.Unit().Units(), e));
-    EXPECT_EQ(2U, e.conflict.size());
-    ASSERT_TRUE(e.compromise);
-    // Both are missed by 0.05 at u = 0.05, where T = 3.
-    EXPECT_NEAR(3.0, e.compromise->factors.at(0), 1e-9);
-    EXPECT_EQ("S1/First Step T", e.compromise->cases.at(0).name);
-
-    T_ULSI_D item = m_doc.Data().Model().ulfStageItems.at(1);
-    item.constraints = {"HOLD"};
-    item.sign = 0; // T = 4 is not negative
-    m_dialog->Data2Dlg(item);
-    EXPECT_EQ(0, m_dialog->OnCalculate());
-    EXPECT_NE(std::string::npos, m_dialog->Messages().back().text.find("(S1/First Step T)"));
-}
-
 TEST_F(StageItem, HoldsItsConstraintsInTheTableAndTakesTheirNewNames)
 {
     T_MODEL_CONTENT content = two::Content();
@@ -161,27 +83,25 @@ TEST_F(StageItem, HoldsItsConstraintsInTheTableAndTakesTheirNewNames)
     CUnknownLoadFactorConstraintDlg constraint(m_doc, 1);
     constraint.m_constraint.name = "FAST";
     ASSERT_EQ(1, constraint.OnOK());
-    EXPECT_EQ(std::vector<std::string>{"FAST"},
-              m_doc.Data().Model().ulfStageItems.at(1).constraints);
-    EXPECT_EQ(1, m_doc.Undo().Undo());
-    EXPECT_EQ("HOLD", m_doc.Data().Model().ulfStageItems.at(1).constraints.at(0));
+    EXPECT_EQ("FAST", m_doc.Data().Model().ulfStageItems.at(1).constraints.at(0));
 }
 
 TEST_F(StageItem, IsListedChangedAndDeletedWithTheStaticOnes)
 {
     m_doc.Data().Assign(two::Content());
-    CNamer view;
+    CScriptView view;
+    view.m_run = [](zql::frx::MDialog& child) {
+        dynamic_cast<CUlfItemDialog&>(child).m_name = "STAY 2";
+        return child.OnOK();
+    };
     CUnknownLoadFactorDlg list(m_doc);
     list.SetView(&view);
     list.m_selected = 1;
     EXPECT_EQ(0, list.OnModify()) << "there is no static item 1";
     list.m_stage = true;
-    view.m_name = "STAY 2";
     ASSERT_EQ(1, list.OnModify());
-    ASSERT_EQ(1U, list.Rows().size());
-    EXPECT_EQ((CUnknownLoadFactorDlg::T_ROW{1, "STAY 2", "", true}), list.Rows()[0]);
+    EXPECT_EQ((CUnknownLoadFactorDlg::T_ROW{1, "STAY 2", "", true}), list.Rows().at(0));
     EXPECT_EQ(0, list.OnAddStage()) << "an empty item is refused";
-    EXPECT_EQ(1, list.m_selected);
     ASSERT_EQ(1, list.OnDelete());
     EXPECT_TRUE(m_doc.Data().Model().ulfStageItems.empty());
     CDBDoc empty;

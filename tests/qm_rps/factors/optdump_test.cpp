@@ -1,9 +1,8 @@
+#include "tempfolder.h"
 #include "ulfsample.h"
 
-#include "qm_db/filectrl.h"
 #include "qm_rps/factors/optdump.h"
 
-#include <filesystem>
 #include <gtest/gtest.h>
 
 namespace {
@@ -30,30 +29,17 @@ constexpr const char* kText = R"(      =========================================
       COEFVEC(2) = -2.250000
 )";
 
-std::string Read(const std::string& path)
-{
-    std::string text;
-    T_FILE_ERROR error;
-    return CFileCtrl::ReadWholeFile(path, text, error) ? text : "no file";
-}
-
 } // namespace
 
 TEST(OptDump, WritesTheProblemHandedOverAndAsksBeforeOverwriting)
 {
-    const std::filesystem::path folder = testing::TempDir() + "qm_optdump";
-    std::filesystem::remove_all(folder);
-    std::filesystem::create_directory(folder);
-    const std::string model = (folder / "frame.qmdb").string();
-    const std::string path = (folder / "frame_[OPTIMIZE].out").string();
-
+    const CTempFolder folder;
+    const std::string path = folder / "frame_[OPTIMIZE].out";
     CTableResponse source;
     source.m_table[{1, 1, 0, 1}] = {1, 2.25};
     T_OPT_PROBLEM p;
     p.items = {{1, 0, 2, 0}, {2, 0, 0.5, 0}};
-    p.nvar = 2;
-    p.iobj = 2;
-    p.isign = -1;
+    p.nvar = p.iobj = 2, p.isign = -1;
     p.constraints = {{1, 1, 1, 5, 1, 1}};
     T_HANDED handed;
     T_OPT_ANSWER answer;
@@ -62,18 +48,16 @@ TEST(OptDump, WritesTheProblemHandedOverAndAsksBeforeOverwriting)
     const auto run = [&] { ASSERT_EQ(1, optimizer.Run(p, answer)); };
 
     run();
-    EXPECT_EQ("no file", Read(path)); // off by default
-    optimizer.m_dump = {true, model, {}};
+    EXPECT_TRUE(folder.Names().empty()); // off by default
+    optimizer.m_dump = {true, folder / "frame.qmdb", {}};
     run();
-    EXPECT_EQ(kText, Read(path));
     run(); // nobody to ask: added
-    EXPECT_EQ(std::string(kText) + kText, Read(path));
+    EXPECT_EQ(std::string(kText) + kText, ReadText(path));
     optimizer.m_dump.overwrite = [] { return true; };
     run();
-    EXPECT_EQ(kText, Read(path));
-    optimizer.m_dump.modelPath = (folder / "missing" / "frame.qmdb").string();
+    EXPECT_EQ(kText, ReadText(path));
+    optimizer.m_dump.modelPath = folder / "missing/frame.qmdb";
     run(); // silently skipped
-    std::filesystem::remove_all(folder);
 }
 
 TEST(OptDump, NamesTheFileByModelAndMode)

@@ -60,14 +60,12 @@ TEST(UlfChecks, ConstraintsAreJudgedRuleByRule)
         {node, "IDS_QM_ULFC_NAME_EXISTS", "name", [](C& c) { c.name = "D2"; c.id = 9; }},
         {node, "IDS_QM_ULFC_TYPE", "type", [](C& c) { c.type = static_cast<ULFC_TYPE>(4); }},
         {node, "IDS_RPS_the_Node_Id_doesn_t_exist", "id", [](C& c) { c.id = 7; c.component = 6; }},
-        {force, "IDS_RPS_the_Node_Id_doesn_t_exist", "id", [](C& c) { c.id = 0; }},
         {beam, "IDS_RPS_the_Elem_Id_doesn_t_exist", "id", [](C& c) { c.id = 7; }},
         {truss, "IDS_RPS_Elem_Id_is_not_of_Truss_", "id", [](C& c) { c.id = 5; }},
         {beam, "IDS_RPS_Elem_Id_is_not_of_Beam_", "id", [](C& c) { c.id = 6; }},
         {beam, "IDS_QM_ULFC_POSITION", "position", [](C& c) { c.position = -1; }},
         {beam, "IDS_QM_ULFC_POSITION", "position", [](C& c) { c.position = 5; }},
         {node, "IDS_QM_ULFC_COMPONENT", "component", [](C& c) { c.component = -1; }},
-        {beam, "IDS_QM_ULFC_COMPONENT", "component", [](C& c) { c.component = 6; }},
         {truss, "IDS_QM_ULFC_COMPONENT", "component", [](C& c) { c.component = 1; }},
         {other(node, 7), "IDS_RPS_the_Other_Node_Id_doesn_t_exist", "otherId"},
         {other(beam, 7), "IDS_RPS_the_Other_Elem_Id_doesn_t_exist", "otherId"},
@@ -77,7 +75,6 @@ TEST(UlfChecks, ConstraintsAreJudgedRuleByRule)
         {node, "IDS_QM_ULFC_VALUE", "value", [](C& c) { c.value = kNan; }},
         {other(node, 4), "", "", [](C& c) { c.value = kNan; }}, // not read
         {bounds({}, {}), "IDS_QM_ULFC_NO_BOUND", "upper"},
-        {bounds(kNan, {}), "IDS_QM_ULFC_VALUE", "upper"},
         {bounds(1.0, -kInf), "IDS_QM_ULFC_VALUE", "lower"},
         {bounds(1.0, above1), "IDS_QM_ULFC_BOUNDS_CROSS", "lower"},
         {bounds(1.0, 1.0), "", ""},
@@ -90,11 +87,8 @@ TEST(UlfChecks, ConstraintsAreJudgedRuleByRule)
         SCOPED_TRACE(&row - cases);
         Judge(CheckUlfConstraint(constraint, 0, doc.Data().Model()), row.rule, row.field);
     }
-    // The ids in words; its own name is free.
-    EXPECT_NE(std::string::npos,
-              CheckUlfConstraint(other(beam, 7), 0, doc.Data().Model())[0].text.find(" 7,"));
-    EXPECT_TRUE(
-        CheckUlfConstraint(doc.Data().Model().ulfConstraints.at(1), 1, doc.Data().Model()).empty());
+    const T_MODEL& model = doc.Data().Model(); // its own name is free
+    EXPECT_TRUE(CheckUlfConstraint(model.ulfConstraints.at(1), 1, model).empty());
 }
 
 TEST(UlfChecks, StaticItemsAreJudgedRuleByRule)
@@ -116,10 +110,8 @@ TEST(UlfChecks, StaticItemsAreJudgedRuleByRule)
         {"IDS_QM_ULFI_COMBINATION", "combination", [](M&, I& i) { i.combination = 7; }},
         {"IDS_QM_ULFI_COMBINATION", "combination", // contains itself
          [](M& m, I&) { m.combinations[1].items.push_back({true, 1, 1.0}); }},
-        {"IDS_QM_ULFI_OBJECTIVE", "objective", [](M&, I& i) { i.objective = -1; }},
         {"IDS_QM_ULFI_OBJECTIVE", "objective", [](M&, I& i) { i.objective = 3; }},
         {"IDS_QM_ULFI_SIGN", "sign", [](M&, I& i) { i.sign = 3; }},
-        {"IDS_QM_ULFI_SIGN", "sign", [](M&, I& i) { i.sign = -1; }},
         {"IDS_RPS_No_Unknown_Load_Factor_defined_", "unknowns",
          [](M&, I& i) { i.unknowns.clear(); i.constraints.clear(); }},
         {"IDS_QM_ULFI_NOT_IN_COMBINATION", "unknowns",
@@ -183,7 +175,6 @@ TEST(UlfChecks, StageItemsAreJudgedRuleByRuleAndRowByRow)
              m.loadCases[3] = m.loadCases[1];
              i.rows.push_back({1, 1, 3, true, 1, 1, true, 0});
          }},
-        {"IDS_QM_ULFI_OBJECTIVE", "objective", "", [](M&, I& i) { i.objective = 3; }},
         {"IDS_QM_ULFI_SIGN", "sign", "", [](M&, I& i) { i.sign = 3; }},
         {"IDS_RPS_No_Unknown_Load_Factor_defined_", "rows", "",
          [](M&, I& i) { i.rows.erase(i.rows.begin()); }},
@@ -191,8 +182,6 @@ TEST(UlfChecks, StageItemsAreJudgedRuleByRuleAndRowByRow)
          [](M&, I& i) { i.constraints.clear(); }},
         {"IDS_QM_ULFI_NO_SUCH_CONSTRAINT", "constraints", "",
          [](M&, I& i) { i.constraints = {"GONE"}; }},
-        {"IDS_QM_ULFI_TWICE", "constraints", "",
-         [](M&, I& i) { i.constraints = {"HOLD", "HOLD"}; }},
         {"IDS_QM_ULSI_CONSTRAINT_PLACE", "constraints", "",
          [](M& m, I&) { m.ulfConstraints[1].stage = 9; }},
         {"IDS_RPS_the_Node_Id_doesn_t_exist", "constraints[HOLD].id", "",
@@ -235,6 +224,4 @@ TEST(UlfChecks, CombinationsAreJudgedRuleByRule)
         SCOPED_TRACE(row.combination.name);
         Judge(CheckCombination(row.combination, row.key, doc.Data()), row.rule, row.field);
     }
-    EXPECT_NE(std::string::npos,
-              CheckCombination(cases[5].combination, 0, doc.Data())[0].text.find('9'));
 }

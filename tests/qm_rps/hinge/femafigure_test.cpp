@@ -60,13 +60,10 @@ TEST(FemaFigure, StrengthLossRepeatsWithoutCyclicDegradationAndFallsWithIt)
     for (std::size_t i = 0; i < 6; ++i) {
         EXPECT_EQ(FigureAmplitudes()[i], plain[i].x);
         EXPECT_NEAR(FigureStrength(plain[i].x), plain[i].y, 1e-12) << i; // on the backbone
-        if (i > 0) {
-            EXPECT_LT(cyclic[i].y, plain[i].y) << i;
-        }
-        if (i % 2 == 1) { // the repeated cycle
-            EXPECT_LT(cyclic[i].y, cyclic[i - 1].y - 1e-3) << i;
-        }
+        EXPECT_LE(cyclic[i].y, plain[i].y) << i;
     }
+    for (const std::size_t repeated : {1U, 3U, 5U})
+        EXPECT_LT(cyclic[repeated].y, cyclic[repeated - 1].y - 1e-3) << repeated;
     EXPECT_NEAR(1.0 + 0.15 * 3.0 / 3.5, plain[2].y, 1e-12); // between B and C
     EXPECT_EQ(0.5, plain[4].y);                             // past D
 }
@@ -81,6 +78,5 @@ TEST(FemaFigure, TheBackboneIsDrawnOnBothSides)
         EXPECT_EQ(line[i].x, -line[10 - i].x);
         EXPECT_EQ(line[i].y, -line[10 - i].y);
     }
-    EXPECT_EQ(5U, CPO_FEMAStrLossFigure0Dlg().Points().size()); // A to E
-    EXPECT_EQ(0.0, FigureStrength(9.0));                        // after E
+    EXPECT_EQ(0.0, FigureStrength(9.0)); // after E
 }

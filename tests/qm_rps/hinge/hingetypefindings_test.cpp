@@ -1,9 +1,6 @@
 // Rules of a whole hinge type: what it refers to, codes, symmetry, automatic strengths, parts.
 #include "hingesample.h"
-#include "qm_rps/hinge/hingemirror.h"
-#include "qm_rps/hinge/hingepreview.h"
 #include "qm_rps/hinge/hingetypefindings.h"
-#include "qm_rps/po_hingeskcvtabfemadlg.h"
 
 #include <functional>
 #include <gtest/gtest.h>
@@ -164,11 +161,7 @@ TEST(HingeTypeFindings, AStoredNegativeSideMustNotContradictSymmetry)
         {
             {"mirrored", Symmetric},
             {"left out", [](T& t) { Fema(t).symmetric = true, Fema(t).sides.neg = {}; }},
-            {"energy and stiffness are its own",
-             [](T& t) {
-                 Symmetric(t);
-                 Fema(t).sides.neg.userStiffness = 9, Fema(t).sides.neg.energy = {};
-             }},
+            {"energy is its own", [](T& t) { Symmetric(t), Fema(t).sides.neg.energy = {}; }},
             {"strength", [](T& t) { Symmetric(t), Fema(t).sides.neg.C.strength = -1.1999999; },
              kSymmetry, "sides.neg.C.strength"},
             {"sign", [](T& t) { Symmetric(t), Fema(t).sides.neg.CP = 6; }, kSymmetry,
@@ -193,63 +186,24 @@ TEST(HingeTypeFindings, AStoredNegativeSideMustNotContradictSymmetry)
         Context());
 }
 
-TEST(HingeTypeFindings, InactiveCriteriaAreNotChecked)
-{
-    Expect(
-        {
-            {"in use", [](T& t) { Fema(t).sides.pos.IO = 5; },
-             "IDS_RPS_Error_Pushove_Hinge_Properties_DOF_s_contains_ERROR", "sides.pos.LS"},
-            {"inactive", [](T& t) { Fema(t).sides.pos.IO = 5, Fema(t).compliance = false; }},
-        },
-        Context());
-}
-
-TEST(HingeMirror, KeepsTheGapOfEachSide)
-{
-    T_SKEL_MULTI m;
-    m.sides.pos.P1 = 10, m.sides.pos.gap = 0.5, m.sides.neg.gap = 0.25;
-    const auto c = MirroredComponent(ComponentWith(SKEL_TYPE::SlipBilinear, m));
-    const T_SKEL_MULTI_SIDE& neg = std::get<T_SKEL_MULTI>(c.curves.J).sides.neg;
-    EXPECT_EQ(10, neg.P1);
-    EXPECT_EQ(0.25, neg.gap);
-}
-
-TEST(HingeCriteria, LeaveThePictureWhenInactive)
-{
-    CPO_HingeSkcvTabFemaDlg dlg;
-    ASSERT_EQ(1, dlg.Data2Dlg(HINGE_COMPONENT::My, Type().components[4]));
-    const T_SKEL_FEMA& f = *dlg.Curve(HINGE_COMPONENT::My, HINGE_END::Both);
-    T_HINGE_PREVIEW preview;
-    ASSERT_EQ(1, BackboneOf(f, SKEL_TYPE::Fema, preview));
-    EXPECT_EQ(6u, preview.marks.size());
-    EXPECT_EQ(1, dlg.OnComplianceChk(HINGE_COMPONENT::My, HINGE_END::Both, false));
-    EXPECT_EQ(0, dlg.OnComplianceChk(HINGE_COMPONENT::Fx, HINGE_END::Both, false));
-    ASSERT_EQ(1, BackboneOf(f, SKEL_TYPE::Fema, preview));
-    EXPECT_TRUE(preview.marks.empty());
-}
-
 TEST(HingeTypeFindings, PartsOfTheTypeAreCheckedUnderTheirNames)
 {
     Expect(
         {
-            {"masonry form 1",
+            {"name", [](T& t) { t.name = ""; }, "IDS_QM_HINGE_NAME_EMPTY", "name"},
+            {"torsion has no Eurocode curve",
              [](T& t) {
-                 t.masonry = {1, 1, 1, 1, 1};
-             }},
-            {"masonry form 2",
-             [](T& t) {
-                 t.masonry = {2, 1, 1, 0, 1};
-             }},
-            {"masonry form 0",
-             [](T& t) {
-                 t.masonry = {0, 1, 1, 0, 9};
+                 t.components[3] = ComponentWith(SKEL_TYPE::Ec8, ValidBackbone<T_SKEL_EC8>());
              },
-             "IDS_QM_MASONRY_FORM", "masonry.form"},
-            {"masonry form 3",
+             "IDS_QM_HINGE_CURVE_NOT_OFFERED", "type"},
+            {"criteria in use", [](T& t) { Fema(t).sides.pos.IO = 5; },
+             "IDS_RPS_Error_Pushove_Hinge_Properties_DOF_s_contains_ERROR", "sides.pos.LS"},
+            {"inactive", [](T& t) { Fema(t).sides.pos.IO = 5, Fema(t).compliance = false; }},
+            {"masonry",
              [](T& t) {
-                 t.masonry = {3, 1, 1, 0, 9};
+                 t.masonry = {1, 1, 1, 0, 1};
              },
-             "IDS_QM_MASONRY_FORM", "masonry.form"},
+             "IDS_RPS_PO_Masonry_Hp_0", "masonry.Hp"},
             {"user curves", [](T& t) { t.pmm.emplace().Pmax = 0; }},
             {"user Pmax", [](T& t) { t.pmm.emplace().Pmax = -1e-9; }, "IDS_PUSHOVER_PMAX_POS",
              "pmm.Pmax"},
@@ -265,24 +219,27 @@ TEST(HingeTypeFindings, PartsOfTheTypeAreCheckedUnderTheirNames)
 
 TEST(HingeTypeWarnings, RatiosMustSuitSeveralCurvesAtOnce)
 {
-    T_SKEL_MULTI m;
-    m.sides.pos.alpha1 = m.sides.neg.alpha1 = 0.1;
-    m.sides.pos.alpha2 = m.sides.neg.alpha2 = 0.1;
-    const auto warnings = [&](SKEL_TYPE type, int curves) {
-        T_PHGT_D t;
-        for (int i = 0; i < curves; ++i)
-            t.components[static_cast<std::size_t>(4 + i)] = ComponentWith(type, m);
-        return HingeTypeWarnings(t).size();
+    const struct {
+        SKEL_TYPE type;
+        std::size_t curves;
+        double alpha1, alpha2;
+        std::size_t warnings;
+        bool useDeformation = false;
+    } kCases[] = {
+        {SKEL_TYPE::Trilinear, 2, 0.1, 0.1, 0}, // equal ratios suit
+        {SKEL_TYPE::Trilinear, 2, 0.1, 0.11, 2},       {SKEL_TYPE::Trilinear, 1, 0.1, 0.11, 0},
+        {SKEL_TYPE::Bilinear, 2, 0.1, 0.11, 0}, // alpha2 is not in use
+        {SKEL_TYPE::Bilinear, 2, 1.0, 0.1, 0},         {SKEL_TYPE::Bilinear, 2, 1.001, 0.1, 2},
+        {SKEL_TYPE::Bilinear, 2, 1.001, 0.1, 0, true},
     };
-    EXPECT_EQ(0u, warnings(SKEL_TYPE::Trilinear, 2)); // equal ratios suit
-    m.sides.pos.alpha2 = 0.11;
-    EXPECT_EQ(2u, warnings(SKEL_TYPE::Trilinear, 2));
-    EXPECT_EQ(0u, warnings(SKEL_TYPE::Trilinear, 1)); // one curve alone
-    EXPECT_EQ(0u, warnings(SKEL_TYPE::Bilinear, 2));  // alpha2 is not in use
-    m.sides.pos.alpha1 = m.sides.pos.alpha2 = 1.0;
-    EXPECT_EQ(0u, warnings(SKEL_TYPE::Bilinear, 2));
-    m.sides.pos.alpha1 = 1.001;
-    EXPECT_EQ(2u, warnings(SKEL_TYPE::Bilinear, 2));
-    m.useDeformation = true;
-    EXPECT_EQ(0u, warnings(SKEL_TYPE::Bilinear, 2));
+    for (const auto& c : kCases) {
+        T_SKEL_MULTI m;
+        m.sides.pos.alpha1 = c.alpha1, m.sides.pos.alpha2 = c.alpha2;
+        m.sides.neg.alpha1 = m.sides.neg.alpha2 = 0.1;
+        m.useDeformation = c.useDeformation;
+        T_PHGT_D t;
+        for (std::size_t i = 0; i < c.curves; ++i)
+            t.components[4 + i] = ComponentWith(c.type, m);
+        EXPECT_EQ(c.warnings, HingeTypeWarnings(t).size()) << "row " << &c - kCases;
+    }
 }
