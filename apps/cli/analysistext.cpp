@@ -2,7 +2,7 @@
 
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
-#include "qm_db/records/structnames.h"
+#include "qm_db/recordfacts.h"
 
 #include <algorithm>
 #include <cmath>

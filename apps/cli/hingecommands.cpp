@@ -2,7 +2,7 @@
 #include "hingetools.h"
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
-#include "qm_db/recordrules.h"
+#include "qm_db/recordfacts.h"
 #include "qm_rps/hinge/hingegenerator.h"
 #include "qm_rps/hinge/hingetypefindings.h"
 #include "qm_rps/po_hingetypelistdlg.h"

@@ -1,6 +1,6 @@
 #include "qm_rps/po_loadcasedlg.h"
 
-#include "qm_db/recordrules.h"
+#include "qm_db/recordfacts.h"
 #include "qm_rps/pushover/loadcasedocrules.h"
 #include "qm_rps/pushover/releaseassert.h"
 

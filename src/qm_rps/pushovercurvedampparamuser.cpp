@@ -1,6 +1,6 @@
 #include "qm_rps/pushovercurvedampparamuser.h"
 
-#include "qm_db/recordrules.h"
+#include "qm_db/recordfacts.h"
 #include "qm_rps/pushover/adrsformulas.h"
 
 #include <algorithm>

@@ -2,7 +2,7 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_db/editscope.h"
-#include "qm_db/recordrules.h"
+#include "qm_db/recordfacts.h"
 #include "qm_rps/desk/recordnames.h"
 #include "qm_rps/pushover/pushoverreport.h"
 #include "qm_rps/pushovercomparisondlg.h"

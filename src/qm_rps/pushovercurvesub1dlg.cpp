@@ -1,7 +1,7 @@
 #include "qm_rps/pushovercurvesub1dlg.h"
 
 #include "qm_base/msgfunction.h"
-#include "qm_db/recordrules.h"
+#include "qm_db/recordfacts.h"
 #include "qm_rps/desk/recordnames.h"
 #include "qm_rps/pushover/pushovercurvedata.h"
 

@@ -1,6 +1,6 @@
 #include "numbers.h"
 #include "qm_base/appbase.h"
-#include "qm_db/recordrules.h"
+#include "qm_db/recordfacts.h"
 #include "qm_rps/po_loadcasedlg.h"
 
 #include <gtest/gtest.h>

@@ -1,6 +1,6 @@
 // Tables of loads, stages, pushover evaluation, hinges and unknown load factors.
 #include "qm_base/msgfunction.h"
-#include "qm_db/recordrules.h"
+#include "qm_db/recordfacts.h"
 #include "qm_rps/desk/recordtable.h"
 #include "qm_rps/desk/recordtables.h"
 #include "qm_rps/factors/ulftexts.h"

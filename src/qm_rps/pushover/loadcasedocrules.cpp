@@ -1,7 +1,7 @@
 #include "qm_rps/pushover/loadcasedocrules.h"
 
 #include "qm_base/ruletable.h"
-#include "qm_db/recordrules.h"
+#include "qm_db/recordfacts.h"
 
 namespace {
 

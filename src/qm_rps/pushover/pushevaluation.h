@@ -4,7 +4,7 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_db/recordrules.h"
+#include "qm_db/recordfacts.h"
 #include "qm_rps/pushover/pushovercurvedata.h"
 #include "qm_rps/pushover/pushovertargetdisp.h"
 

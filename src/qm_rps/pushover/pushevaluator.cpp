@@ -3,7 +3,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_db/filectrl.h"
-#include "qm_db/recordrules.h"
+#include "qm_db/recordfacts.h"
 #include "qm_rps/pushover/adrsformulas.h"
 #include "qm_rps/pushover/pushoverallpoints.h"
 #include "qm_rps/pushover/refusal.h"

@@ -1,7 +1,7 @@
 #include "qm_ui/loadcase/loadcaseview.h"
 
 #include "qm_base/textformat.h"
-#include "qm_db/recordrules.h"
+#include "qm_db/recordfacts.h"
 #include "qm_rps/dialog/unithead.h"
 #include "qm_rps/po_loadcasedlg.h"
 #include "qm_rps/po_loadcaselistdlg.h"
