@@ -1,24 +1,176 @@
 #include "qm_db/store/recordcodecpacked.h"
 
 #include "qm_db/file/storefault.h"
+#include "qm_db/store/packednumbers.h"
 
 #include <algorithm>
-#include <cstring>
+#include <bit>
+#include <variant>
 
 namespace {
 
 constexpr std::size_t kChunkNodes = 512; // nodes that are packed together
+constexpr const char* kElements = "elements";
+constexpr const char* kHinges = "hinges"; // generated ones are many and small
 
-// Generated hinges are many and small: a few packed lists for all of them.
-constexpr const char* kHinges = "hinges";
-constexpr std::size_t kHingeWidth = 3; // key, element, type
-constexpr std::size_t kStrengthWidth = sizeof(T_PHGE_D::crack) / sizeof(double); // crack; yield
+/// A list in which everything is 0 is left out, as files of version 2 leave out most of an
+/// element's; -0.0 is not 0.
+enum class LIST { Always, UnlessZero };
 
-/// Takes the n-th group of as many packed numbers as `to` has.
-template <class T, std::size_t N>
-void TakeGroup(std::span<const std::byte> from, std::size_t n, std::array<T, N>& to)
+// ---- the lists of each kind: the first has the key ----------------------------------------------
+
+template <class V, class N>
+requires std::same_as<std::remove_const_t<N>, T_NODE_D>
+void PackedLists(V& v, auto& key, N& n)
 {
-    std::memcpy(to.data(), from.data() + n * sizeof to, sizeof to);
+    v.List("id", LIST::Always, key);
+    v.List("xyz", LIST::Always, n.xyz);
+    v.List("mass", LIST::Always, n.mass);
+    v.List("restraint", LIST::UnlessZero, n.restraint);
+}
+
+template <class V, class E>
+requires std::same_as<std::remove_const_t<E>, T_ELEM_D>
+void PackedLists(V& v, auto& key, E& e)
+{
+    v.List("data", LIST::Always, key, e.nodeI, e.nodeJ, e.section, e.material, e.member);
+    v.List("kind", LIST::UnlessZero, e.kind);
+    v.List("release", LIST::UnlessZero, e.release);
+    v.List("z_axis", LIST::UnlessZero, e.zAxis);
+    v.List("offset", LIST::UnlessZero, e.offset);
+    v.List("stiffness", LIST::UnlessZero, e.stiffness);
+}
+
+template <class V, class H>
+requires std::same_as<std::remove_const_t<H>, T_PHGE_D>
+void PackedLists(V& v, auto& key, H& h)
+{
+    v.List("refs", LIST::Always, key, h.element, h.hingeType);
+    v.List("crack", LIST::Always, h.crack);
+    v.List("yield", LIST::Always, h.yield);
+}
+
+// ---- writing and reading them -------------------------------------------------------------------
+
+struct T_LIST {
+    const char* name = "";
+    LIST rule = LIST::Always;
+    std::variant<std::vector<int>, std::vector<double>> numbers;
+};
+
+bool IsZero(int v)
+{
+    return v == 0;
+}
+bool IsZero(double v)
+{
+    return std::bit_cast<std::uint64_t>(v) == 0;
+}
+
+/// Goes through the lists of one record after the other, always in the same order.
+class CPackPut {
+public:
+    template <class R>
+    void Add(int key, const R& record)
+    {
+        m_next = 0;
+        PackedLists(*this, key, record);
+    }
+    template <class FIRST, class... REST>
+    void List(const char* name, LIST rule, const FIRST& first, const REST&... rest)
+    {
+        using NUMBERS = std::vector<PACKED_SCALAR<FIRST>>;
+        if (m_next == m_lists.size()) m_lists.push_back({name, rule, NUMBERS()});
+        NUMBERS& to = std::get<NUMBERS>(m_lists[m_next++].numbers);
+        CNumberWriter::Put(to, first);
+        (CNumberWriter::Put(to, rest), ...);
+    }
+    void Store(const char* owner, std::int64_t chunk, CPackedArrays& arrays) const
+    {
+        for (const T_LIST& list : m_lists)
+            std::visit(
+                [&](const auto& numbers) {
+                    const auto isZero = [](auto v) { return IsZero(v); };
+                    if (list.rule == LIST::Always || !std::ranges::all_of(numbers, isZero))
+                        arrays.Put(owner, chunk, list.name, numbers);
+                },
+                list.numbers);
+    }
+
+private:
+    std::vector<T_LIST> m_lists;
+    std::size_t m_next = 0;
+};
+
+class CPackGet {
+public:
+    CPackGet(const CPackedArrays& arrays, const char* owner, std::int64_t chunk)
+        : m_arrays(arrays), m_owner(owner), m_chunk(chunk)
+    {
+    }
+    /// The records; throws "damaged" with `place` where the lists do not go together.
+    template <class R>
+    void Take(T_TABLE<R>& table, const std::string& place)
+    {
+        for (m_at = 0; m_at < m_count; ++m_at) {
+            m_next = 0;
+            int key = 0;
+            R record;
+            PackedLists(*this, key, record);
+            if (!m_isRight) ThrowDamaged(place);
+            if (m_count == kUnknown) return; // no list at all
+            if constexpr (requires { record.id; }) record.id = key;
+            table.emplace_hint(table.end(), key, std::move(record));
+        }
+    }
+    template <class FIRST, class... REST>
+    void List(const char* name, LIST rule, FIRST& first, REST&... rest)
+    {
+        using SCALAR = PACKED_SCALAR<FIRST>;
+        constexpr std::size_t kWidth =
+            (T_PACKED_AS<FIRST>::kCount + ... + T_PACKED_AS<REST>::kCount);
+        if (m_next == m_lists.size()) Load<SCALAR>(name, rule, kWidth);
+        const auto& numbers = std::get<std::vector<SCALAR>>(m_lists[m_next++].numbers);
+        if (!m_isRight || numbers.empty()) return;
+        const SCALAR* from = &numbers[m_at * kWidth];
+        m_isRight = CNumberReader::Take(from, first) && (CNumberReader::Take(from, rest) && ...);
+    }
+
+private:
+    static constexpr std::size_t kUnknown = static_cast<std::size_t>(-1);
+
+    template <class SCALAR>
+    void Load(const char* name, LIST rule, std::size_t width)
+    {
+        std::vector<SCALAR> numbers;
+        if constexpr (std::same_as<SCALAR, int>)
+            numbers = m_arrays.Ints(m_owner, m_chunk, name);
+        else
+            numbers = m_arrays.Doubles(m_owner, m_chunk, name);
+        if (m_lists.empty() && !numbers.empty() && numbers.size() % width == 0)
+            m_count = numbers.size() / width;
+        const std::size_t count = m_count == kUnknown ? 0 : m_count;
+        const bool isLeftOut = rule == LIST::UnlessZero && numbers.empty();
+        m_isRight = m_isRight && (isLeftOut || numbers.size() == count * width);
+        m_lists.push_back({name, rule, std::move(numbers)});
+    }
+
+    const CPackedArrays& m_arrays;
+    const char* m_owner;
+    std::int64_t m_chunk;
+    std::vector<T_LIST> m_lists;
+    std::size_t m_count = kUnknown; // of the records; known from the first list
+    std::size_t m_at = 0, m_next = 0;
+    bool m_isRight = true;
+};
+
+template <class R>
+void PutAll(const T_TABLE<R>& table, const char* owner, CPackedArrays& arrays)
+{
+    CPackPut put;
+    for (const auto& [key, record] : table)
+        put.Add(key, record);
+    put.Store(owner, 0, arrays);
 }
 
 } // namespace
@@ -27,80 +179,36 @@ void PutNodes(const T_TABLE<T_NODE_D>& nodes, CPackedArrays& arrays)
 {
     auto node = nodes.begin();
     for (std::int64_t chunk = 0; node != nodes.end(); ++chunk) {
-        std::vector<int> ids, restraint;
-        std::vector<double> xyz, mass;
-        for (; node != nodes.end() && ids.size() < kChunkNodes; ++node) {
-            const T_NODE_D& n = node->second;
-            ids.push_back(n.id);
-            xyz.insert(xyz.end(), n.xyz.begin(), n.xyz.end());
-            mass.insert(mass.end(), n.mass.begin(), n.mass.end());
-            restraint.insert(restraint.end(), n.restraint.begin(), n.restraint.end());
-        }
-        arrays.Put(kNodes, chunk, "id", ids);
-        arrays.Put(kNodes, chunk, "xyz", xyz);
-        arrays.Put(kNodes, chunk, "mass", mass);
-        // Most nodes have no restraint: a chunk without any has no array of them.
-        if (std::any_of(restraint.begin(), restraint.end(), [](int flag) { return flag != 0; }))
-            arrays.Put(kNodes, chunk, "restraint", restraint);
+        CPackPut put;
+        for (std::size_t i = 0; i < kChunkNodes && node != nodes.end(); ++i, ++node)
+            put.Add(node->first, node->second);
+        put.Store(kNodes, chunk, arrays);
     }
 }
 
 void GetNodeChunk(const CPackedArrays& arrays, std::int64_t chunk, T_TABLE<T_NODE_D>& nodes)
 {
-    if (static_cast<std::size_t>(chunk) * kChunkNodes != nodes.size())
-        ThrowDamaged(kNodes + (' ' + std::to_string(chunk)));
-    const std::vector<int> ids = arrays.Ints(kNodes, chunk, "id");
-    const auto xyz = arrays.Bytes(kNodes, chunk, "xyz", 'f');
-    const auto mass = arrays.Bytes(kNodes, chunk, "mass", 'f');
-    const auto restraint = arrays.Bytes(kNodes, chunk, "restraint", 'i');
-    if (xyz.size() != ids.size() * sizeof(T_NODE_D::xyz) ||
-        mass.size() != ids.size() * sizeof(T_NODE_D::mass) ||
-        (!restraint.empty() && restraint.size() != ids.size() * sizeof(T_NODE_D::restraint)))
-        ThrowDamaged(kNodes + (' ' + std::to_string(chunk)));
-    for (std::size_t i = 0; i < ids.size(); ++i) {
-        T_NODE_D& node = nodes.try_emplace(nodes.end(), ids[i])->second;
-        node.id = ids[i];
-        TakeGroup(xyz, i, node.xyz);
-        TakeGroup(mass, i, node.mass);
-        if (!restraint.empty()) TakeGroup(restraint, i, node.restraint);
-    }
+    const std::string place = kNodes + (' ' + std::to_string(chunk));
+    if (static_cast<std::size_t>(chunk) * kChunkNodes != nodes.size()) ThrowDamaged(place);
+    CPackGet(arrays, kNodes, chunk).Take(nodes, place);
+}
+
+void PutElements(const T_TABLE<T_ELEM_D>& elements, CPackedArrays& arrays)
+{
+    PutAll(elements, kElements, arrays);
+}
+
+void GetElements(const CPackedArrays& arrays, T_TABLE<T_ELEM_D>& elements)
+{
+    CPackGet(arrays, kElements, 0).Take(elements, kElements);
 }
 
 void PutHinges(const T_TABLE<T_PHGE_D>& hinges, CPackedArrays& arrays)
 {
-    std::vector<int> refs;
-    std::vector<double> crack, yield;
-    for (const auto& [key, hinge] : hinges) {
-        refs.insert(refs.end(), {key, hinge.element, hinge.hingeType});
-        for (std::size_t i = 0; i < hinge.crack.size(); ++i) {
-            crack.insert(crack.end(), {hinge.crack[i].pos, hinge.crack[i].neg});
-            yield.insert(yield.end(), {hinge.yield[i].pos, hinge.yield[i].neg});
-        }
-    }
-    if (refs.empty()) return;
-    arrays.Put(kHinges, 0, "refs", refs);
-    arrays.Put(kHinges, 0, "crack", crack);
-    arrays.Put(kHinges, 0, "yield", yield);
+    PutAll(hinges, kHinges, arrays);
 }
 
 void GetHinges(const CPackedArrays& arrays, T_TABLE<T_PHGE_D>& hinges)
 {
-    const std::vector<int> refs = arrays.Ints(kHinges, 0, "refs");
-    const std::vector<double> crack = arrays.Doubles(kHinges, 0, "crack");
-    const std::vector<double> yield = arrays.Doubles(kHinges, 0, "yield");
-    const std::size_t count = refs.size() / kHingeWidth;
-    if (refs.size() % kHingeWidth != 0 || crack.size() != count * kStrengthWidth ||
-        yield.size() != crack.size())
-        ThrowDamaged(kHinges);
-    for (std::size_t i = 0; i < count; ++i) {
-        const int* const from = &refs[i * kHingeWidth];
-        T_PHGE_D& hinge = hinges.try_emplace(hinges.end(), from[0])->second;
-        hinge.element = from[1];
-        hinge.hingeType = from[2];
-        for (std::size_t c = 0; c < hinge.crack.size(); ++c) {
-            const std::size_t at = i * kStrengthWidth + 2 * c;
-            hinge.crack[c] = {crack[at], crack[at + 1]};
-            hinge.yield[c] = {yield[at], yield[at + 1]};
-        }
-    }
+    CPackGet(arrays, kHinges, 0).Take(hinges, kHinges);
 }
