@@ -29,12 +29,15 @@ using P = T_MULTI_PAGE;
 /// What the number of a row is, for its unit.
 enum class KIND { Strength, Deform, Stiffness, Ratio };
 
+/// Keys of the text for a force and for a moment.
+using TEXTS = std::array<const char*, 2>;
+
 /// A row of the table: shown for the curves that have it, usable with the options in force.
 struct T_ROW {
     const char* name; // of the member
     double SIDE::*member;
     KIND kind;
-    const char *force, *moment; // keys of the text
+    TEXTS texts;
     bool (*shown)(const P&);
     bool (*enabled)(const P&);
 };
@@ -77,25 +80,44 @@ bool User(const P& p)
     return p.Curve().initStiffness == INIT_STIFFNESS::User;
 }
 
+bool TriDeformation(const P& p)
+{
+    return Tri(p) && Deformation(p);
+}
+bool TriRatios(const P& p)
+{
+    return Tri(p) && Ratios(p);
+}
+
+constexpr TEXTS Both(const char* key)
+{
+    return {key, key};
+}
+constexpr TEXTS kYield{"IDS_RPS_PUSHOVER_YIELD_FROCE", "IDS_RPS_PUSHOVER_YIELD_MOMENT"};
+constexpr TEXTS kCrack{"IDS_RPS_PUSHOVER_CRACK_FROCE", "IDS_RPS_PUSHOVER_CRACK_MOMENT"};
+constexpr TEXTS kSecond{"IDS_QM_UI_HINGE_SECOND_FORCE", "IDS_QM_UI_HINGE_SECOND_MOMENT"};
+constexpr TEXTS kUltimate{"IDS_QM_UI_HINGE_ULT_FORCE", "IDS_QM_UI_HINGE_ULT_MOMENT"};
+constexpr TEXTS kStiffness = Both("IDS_QM_UI_HINGE_USER_STIFFNESS");
+
 // clang-format off
 constexpr T_ROW kRows[] = {
-    {"P1",     &SIDE::P1,     KIND::Strength, "IDS_RPS_PUSHOVER_YIELD_FROCE", "IDS_RPS_PUSHOVER_YIELD_MOMENT", Bi, Entered},
-    {"P1",     &SIDE::P1,     KIND::Strength, "IDS_RPS_PUSHOVER_CRACK_FROCE", "IDS_RPS_PUSHOVER_CRACK_MOMENT", Tri, Entered},
-    {"P2",     &SIDE::P2,     KIND::Strength, "IDS_RPS_PUSHOVER_YIELD_FROCE", "IDS_RPS_PUSHOVER_YIELD_MOMENT", Tri, Entered},
-    {"P2",     &SIDE::P2,     KIND::Strength, "IDS_QM_UI_HINGE_SECOND_FORCE", "IDS_QM_UI_HINGE_SECOND_MOMENT", Bi, Second},
-    {"P3",     &SIDE::P3,     KIND::Strength, "IDS_QM_UI_HINGE_ULT_FORCE",    "IDS_QM_UI_HINGE_ULT_MOMENT",    Always, Ultimate},
-    {"D1",     &SIDE::D1,     KIND::Deform,   "IDS_QM_UI_HINGE_D1",           "IDS_QM_UI_HINGE_D1",            Deformation, Always},
-    {"D2",     &SIDE::D2,     KIND::Deform,   "IDS_QM_UI_HINGE_D2",           "IDS_QM_UI_HINGE_D2",            Deformation, Always},
-    {"D3",     &SIDE::D3,     KIND::Deform,   "IDS_QM_UI_HINGE_D3",           "IDS_QM_UI_HINGE_D3",            [](const P& p) { return Deformation(p) && p.Tri(); }, Always},
-    {"alpha1", &SIDE::alpha1, KIND::Ratio,    "IDS_QM_UI_HINGE_ALPHA1",       "IDS_QM_UI_HINGE_ALPHA1",        Ratios, Always},
-    {"alpha2", &SIDE::alpha2, KIND::Ratio,    "IDS_QM_UI_HINGE_ALPHA2",       "IDS_QM_UI_HINGE_ALPHA2",        [](const P& p) { return Ratios(p) && p.Tri(); }, Always},
-    {"userStiffness", &SIDE::userStiffness, KIND::Stiffness, "IDS_QM_UI_HINGE_USER_STIFFNESS", "IDS_QM_UI_HINGE_USER_STIFFNESS", Always, User},
+    {"P1",     &SIDE::P1,     KIND::Strength, kYield,    Bi,  Entered},
+    {"P1",     &SIDE::P1,     KIND::Strength, kCrack,    Tri, Entered},
+    {"P2",     &SIDE::P2,     KIND::Strength, kYield,    Tri, Entered},
+    {"P2",     &SIDE::P2,     KIND::Strength, kSecond,   Bi,  Second},
+    {"P3",     &SIDE::P3,     KIND::Strength, kUltimate, Always, Ultimate},
+    {"D1",     &SIDE::D1,     KIND::Deform,   Both("IDS_QM_UI_HINGE_D1"), Deformation, Always},
+    {"D2",     &SIDE::D2,     KIND::Deform,   Both("IDS_QM_UI_HINGE_D2"), Deformation, Always},
+    {"D3",     &SIDE::D3,     KIND::Deform,   Both("IDS_QM_UI_HINGE_D3"), TriDeformation, Always},
+    {"alpha1", &SIDE::alpha1, KIND::Ratio,    Both("IDS_QM_UI_HINGE_ALPHA1"), Ratios, Always},
+    {"alpha2", &SIDE::alpha2, KIND::Ratio,    Both("IDS_QM_UI_HINGE_ALPHA2"), TriRatios, Always},
+    {"userStiffness", &SIDE::userStiffness, KIND::Stiffness, kStiffness, Always, User},
 };
 // clang-format on
 
 std::string TextOf(const P& p, const T_ROW& row)
 {
-    const std::string key = p.Moment() ? row.moment : row.force;
+    const std::string key = row.texts[p.Moment() ? 1 : 0];
     switch (row.kind) {
     case KIND::Strength:
         return StrengthHead(key, p.dlg.Which(), p.dlg.m_owner);
