@@ -1,9 +1,10 @@
 // Commands that edit or draw a hinge type.
 #include "hingetools.h"
 #include "qm_base/say.h"
+#include "qm_rps/hinge/axialforcelist.h"
 #include "qm_rps/hinge/hingemirror.h"
+#include "qm_rps/hinge/hingetable.h"
 #include "qm_rps/hinge/sectionstrength.h"
-#include "qm_rps/po_hingeskcvtabfemaaxialgrid.h"
 #include "qm_rps/po_hingeskcvtabfemadlg.h"
 
 #ifdef QM_UI
@@ -20,7 +21,7 @@ EXIT_CODE StoreType(CDBDoc& doc, int key, T_PHGT_D& type, const std::string& out
 {
     for (T_HINGE_COMPONENT& component : type.components)
         component = MirroredComponent(component);
-    if (!doc.Edit().Begin("hinge type") || !doc.Edit().Put(key, type) || !doc.Edit().Commit())
+    if (!StoreHingeType(doc, key, type))
         return Complain(EXIT_CODE::BadInput, Say("IDS_QM_CLI_HINGE_NOT_STORED", doc.Path()));
     return SaveDocument(doc, out);
 }
@@ -82,16 +83,15 @@ EXIT_CODE RunHingeAxial(const T_HINGE_OPTIONS& o)
                   : nullptr;
     auto* fema = curve ? std::get_if<T_SKEL_FEMA>(curve) : nullptr;
     if (!fema) return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_NO_FEMA", o.file));
-    CPO_HingeSkcvTabFemaAxialGrid grid;
-    grid.Data2Dlg(fema->curves);
-    bool ok = true;
+    CAxialForceList forces(fema->curves);
+    CAxialForceList::REFUSAL refusal;
     for (const double axial : o.add)
-        ok = ok && grid.AddForce(axial);
+        if (!refusal) refusal = forces.Add(axial);
     for (const double axial : o.remove)
-        ok = ok && grid.RemoveForce(axial);
-    if (o.change.size() == 2) ok = ok && grid.ChangeForce(o.change[0], o.change[1]);
-    if (!ok) return Complain(EXIT_CODE::Usage, grid.Messages().back().text);
-    grid.Dlg2Data(fema->curves, fema->sides);
+        if (!refusal) refusal = forces.Remove(axial);
+    if (o.change.size() == 2 && !refusal) refusal = forces.Change(o.change[0], o.change[1]);
+    if (refusal) return Complain(EXIT_CODE::Usage, refusal->text);
+    fema->curves = forces.Curves(fema->sides);
     fema->multiCurve = !fema->curves.empty();
     if (fema->curves.size() == 1)
         return Complain(EXIT_CODE::Usage, Say("IDS_RPS_MULTI_CURVE_COUNT"));

@@ -163,16 +163,7 @@ EXIT_CODE RunHingeGenerated(const T_HINGE_OPTIONS& o)
 {
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
-    CPushOverHingeListDlg list;
-    list.m_types = [&] { return doc.Data().Model().hingeTypes; };
-    list.m_hinges = [&] {
-        T_TABLE<T_PHGE_D> hinges;
-        for (const auto& entry : doc.Data().Model().hinges) {
-            T_PHGE_D hinge; // in current units
-            if (doc.Attr().GetPhge(entry.first, hinge)) hinges.emplace(entry.first, hinge);
-        }
-        return hinges;
-    };
+    const CPushOverHingeListDlg list(doc);
     const std::size_t count = doc.Data().Model().hinges.size();
     if (count > 0) {
         PrintHinges(list, false, doc.Unit().Units());

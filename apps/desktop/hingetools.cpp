@@ -1,6 +1,8 @@
 #include "hingetools.h"
 
-#include "qm_rps/hingedocument.h"
+#include "qm_rps/po_hingetypelistdlg.h"
+#include "qm_rps/pushoverhingedatatype.h"
+#include "qm_rps/pushoverhingelistdlg.h"
 #include "qm_ui/hinge/hingeviews.h"
 
 namespace {
@@ -9,7 +11,7 @@ constexpr const char* kMenu = "IDS_QM_UI_MENU_HINGES";
 
 void RunTypeList(T_DESKTOP& desktop)
 {
-    CPO_HingeTypeListDlg list(HingeTypesOf(desktop.doc));
+    CPO_HingeTypeListDlg list(desktop.doc);
     list.SetView(&desktop.view);
     (void)list.DoModal();
     desktop.changed();
@@ -17,8 +19,7 @@ void RunTypeList(T_DESKTOP& desktop)
 
 void RunHingeList(T_DESKTOP& desktop, int selected)
 {
-    CPushOverHingeListDlg list;
-    ConnectHinges(desktop.doc, list);
+    CPushOverHingeListDlg list(desktop.doc);
     list.SetView(&desktop.view);
     list.m_selected = selected;
     (void)list.DoModal();
@@ -27,8 +28,7 @@ void RunHingeList(T_DESKTOP& desktop, int selected)
 
 void RunTable(T_DESKTOP& desktop)
 {
-    CPushOverHingeDataType table;
-    ConnectHinges(desktop.doc, table);
+    CPushOverHingeDataType table(desktop.doc);
     table.SetView(&desktop.view);
     if (!table.ChooseFirst()) return;
     (void)table.DoModal();
@@ -37,7 +37,7 @@ void RunTable(T_DESKTOP& desktop)
 
 void RunTypeEditor(T_DESKTOP& desktop, int key)
 {
-    CPO_HingeTypeListDlg list(HingeTypesOf(desktop.doc));
+    CPO_HingeTypeListDlg list(desktop.doc);
     list.SetView(&desktop.view);
     list.m_selected = key;
     (void)list.OnModify();

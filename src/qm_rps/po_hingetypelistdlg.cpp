@@ -1,7 +1,10 @@
 #include "qm_rps/po_hingetypelistdlg.h"
 
 #include "qm_base/msgfunction.h"
+#include "qm_db/editscope.h"
+#include "qm_rps/hinge/hingecontext.h"
 #include "qm_rps/hinge/hingelabels.h"
+#include "qm_rps/hinge/hingetable.h"
 #include "qm_rps/po_hingetypedlg.h"
 
 #include <algorithm>
@@ -22,14 +25,10 @@ std::string Listed(const std::vector<int>& ids)
 
 } // namespace
 
-CPO_HingeTypeListDlg::CPO_HingeTypeListDlg(T_HINGE_LIST_ACCESS access) : m_access(std::move(access))
-{
-}
-
 std::vector<CPO_HingeTypeListDlg::T_ROW> CPO_HingeTypeListDlg::Rows() const
 {
     std::vector<T_ROW> rows;
-    for (const auto& [key, type] : m_access.types())
+    for (const auto& [key, type] : HingeTypesOf(m_doc))
         rows.push_back({key, NameOf(key, type.name), DataToStr(type.element)});
     return rows;
 }
@@ -55,7 +54,7 @@ std::optional<zql::frx::T_MESSAGE> CPO_HingeTypeListDlg::ChoiceFault(int key, bo
 
 int CPO_HingeTypeListDlg::CheckData()
 {
-    const auto fault = ChoiceFault(m_selected, m_access.types().contains(m_selected));
+    const auto fault = ChoiceFault(m_selected, HingeTypesOf(m_doc).contains(m_selected));
     if (!fault) return 1;
     ShowMessage(fault->key, fault->text);
     return 0;
@@ -64,31 +63,31 @@ int CPO_HingeTypeListDlg::CheckData()
 int CPO_HingeTypeListDlg::OnDelete()
 {
     if (!CheckData()) return 0;
-    const std::vector<int> users = m_access.users(m_selected);
+    const std::vector<int> users = m_doc.Attr().GetElemsByPhgt(m_selected);
     if (!users.empty()) {
         constexpr const char* used = "IDS_QM_HINGE_TYPE_USED";
         ShowMessage(used, MMSGFunction::Format(used, {std::to_string(m_selected), Listed(users)}));
         return 0;
     }
-    if (!m_access.erase(m_selected)) return 0;
+    if (!EraseHingeType(m_doc, m_selected)) return 0;
     m_selected = 0;
     return 1;
 }
 
 int CPO_HingeTypeListDlg::OnAdd()
 {
-    return Edit(NextKey(), {}, true);
+    return Edit(NextKey(m_doc.Data().Model().hingeTypes), {}, true);
 }
 
 int CPO_HingeTypeListDlg::OnModify()
 {
-    return CheckData() ? Edit(m_selected, m_access.types().at(m_selected), false) : 0;
+    return CheckData() ? Edit(m_selected, HingeTypesOf(m_doc).at(m_selected), false) : 0;
 }
 
 int CPO_HingeTypeListDlg::OnCopy()
 {
-    if (!CheckData() || !m_access.store) return 0;
-    const T_TABLE<T_PHGT_D> types = m_access.types();
+    if (!CheckData()) return 0;
+    const T_TABLE<T_PHGT_D> types = HingeTypesOf(m_doc);
     T_PHGT_D copy = types.at(m_selected);
     const auto taken = [&](const std::string& name) {
         return std::ranges::any_of(types, [&](const auto& t) { return t.second.name == name; });
@@ -96,8 +95,8 @@ int CPO_HingeTypeListDlg::OnCopy()
     const std::string name = copy.name;
     for (int n = 2; taken(copy.name); ++n)
         copy.name = name + " (" + std::to_string(n) + ")";
-    const int key = NextKey();
-    if (!m_access.store(key, copy)) {
+    const int key = NextKey(m_doc.Data().Model().hingeTypes);
+    if (!StoreHingeType(m_doc, key, copy)) {
         ShowMessage("IDS_QM_HINGE_NOT_STORED");
         return 0;
     }
@@ -107,14 +106,14 @@ int CPO_HingeTypeListDlg::OnCopy()
 
 std::string CPO_HingeTypeListDlg::Description() const
 {
-    const T_TABLE<T_PHGT_D> types = m_access.types();
+    const T_TABLE<T_PHGT_D> types = HingeTypesOf(m_doc);
     const auto type = types.find(m_selected);
     if (type == types.end()) return {};
     std::string components;
     for (std::size_t i = 0; i < type->second.components.size(); ++i)
         if (type->second.components[i].active)
             components += (components.empty() ? "" : ", ") + std::string(kComponentNames[i]);
-    const std::vector<int> users = m_access.users(m_selected);
+    const std::vector<int> users = m_doc.Attr().GetElemsByPhgt(m_selected);
     return MMSGFunction::Format("IDS_QM_UI_HINGE_DESCRIPTION",
                                 {NameOf(type->first, type->second.name),
                                  components.empty() ? "-" : components,
@@ -123,11 +122,10 @@ std::string CPO_HingeTypeListDlg::Description() const
 
 int CPO_HingeTypeListDlg::Edit(int key, const T_PHGT_D& type, bool fresh)
 {
-    if (!m_access.store || !m_access.context) return 0;
-    CPO_HingeTypeDlg dlg(m_access.context());
+    CPO_HingeTypeDlg dlg(HingeContextOf(m_doc));
     dlg.SetView(View());
-    dlg.m_store = [&](const T_PHGT_D& t) { return m_access.store(key, t); };
-    for (const auto& [other, record] : m_access.types())
+    dlg.m_store = [&](const T_PHGT_D& t) { return StoreHingeType(m_doc, key, t); };
+    for (const auto& [other, record] : HingeTypesOf(m_doc))
         if (other != key) dlg.m_otherNames.push_back(record.name);
     dlg.Data2Dlg(type);
     for (int c = 0; fresh && c < 6; ++c)
@@ -135,10 +133,4 @@ int CPO_HingeTypeListDlg::Edit(int key, const T_PHGT_D& type, bool fresh)
     if (!dlg.DoModal()) return 0;
     m_selected = key;
     return 1;
-}
-
-int CPO_HingeTypeListDlg::NextKey() const
-{
-    const T_TABLE<T_PHGT_D> types = m_access.types();
-    return types.empty() ? 1 : types.rbegin()->first + 1;
 }

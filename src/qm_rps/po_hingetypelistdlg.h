@@ -1,22 +1,10 @@
-// Model of the list of hinge types.
+// Model of the list of hinge types of a document, in its current units.
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_db/records.h"
-#include "qm_rps/hinge/hingecontext.h"
+#include "qm_db/dbdoc.h"
 
-#include <functional>
 #include <optional>
-
-/// How the list reaches the document.
-struct T_HINGE_LIST_ACCESS {
-    std::function<T_TABLE<T_PHGT_D>()> types;       // all hinge types by key
-    std::function<std::vector<int>(int key)> users; // ids of the elements with hinges of the type
-    std::function<int(int key)> erase;              // 1 deleted
-    /// Adds or replaces a type; 1 stored. Empty: types can't be edited.
-    std::function<int(int key, const T_PHGT_D& type)> store{};
-    std::function<T_HINGE_CONTEXT()> context{}; // of the editor
-};
 
 class CPO_HingeTypeListDlg : public zql::frx::MDialog {
 public:
@@ -29,7 +17,8 @@ public:
     static constexpr std::array<const char*, 2> kHeads{"IDS_RPS_PO_Hinge_Name",
                                                        "IDS_RPS_PO_Element_Type"};
 
-    explicit CPO_HingeTypeListDlg(T_HINGE_LIST_ACCESS access);
+    /// The document must outlive the list.
+    explicit CPO_HingeTypeListDlg(CDBDoc& doc) : m_doc(doc) {}
 
     std::vector<T_ROW> Rows() const;
     /// Text of an element type; a value outside the five is shown as an error, not refused.
@@ -56,7 +45,6 @@ public:
 
 private:
     int Edit(int key, const T_PHGT_D& type, bool fresh);
-    int NextKey() const;
 
-    T_HINGE_LIST_ACCESS m_access;
+    CDBDoc& m_doc;
 };

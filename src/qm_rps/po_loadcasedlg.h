@@ -75,7 +75,7 @@ private:
     bool HasSelection() const;
     /// Shows the first of them. True where there is none.
     bool IsKept(const std::vector<T_FINDING>& findings);
-    bool Store(CEditData& edit, const T_POLC_D& record);
+    bool Store(CEditScope& edit, const T_POLC_D& record);
     bool IsAsRead();
     void KeepRead();
 

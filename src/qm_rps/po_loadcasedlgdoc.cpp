@@ -88,7 +88,7 @@ bool CPO_LoadCaseDlg::HasResults() const
     return Doc() && HasPushResults(*Doc(), m_key);
 }
 
-bool CPO_LoadCaseDlg::Store(CEditData& edit, const T_POLC_D& record)
+bool CPO_LoadCaseDlg::Store(CEditScope& edit, const T_POLC_D& record)
 {
     T_POLC_D before;
     if (m_key != 0 && Doc()->Attr().GetPolc(m_key, before) && before.name != record.name)
@@ -130,7 +130,7 @@ int CPO_LoadCaseDlg::OnOK()
     T_POLC_D record;
     if (!Dlg2Data(record)) return 0;
     const int before = m_key;
-    if (Edit("IDS_QM_UI_TABLE_PUSHOVERS", [&](CEditData& edit) { return Store(edit, record); })) {
+    if (Edit("IDS_QM_UI_TABLE_PUSHOVERS", [&](CEditScope& edit) { return Store(edit, record); })) {
         KeepRead();
         return 1;
     }

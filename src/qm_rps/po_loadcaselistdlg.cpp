@@ -42,7 +42,7 @@ int CPO_LoadCaseListDlg::OnCopy()
     copy.name = Doc()->Attr().FindPolc(name, taken) ? fresh.name : name;
     if (!copy.control) copy.control = fresh.control;
     const int key = CPO_LoadCaseDlg::NextKey(*Doc());
-    if (!Edit(kTitle, [&](CEditData& edit) { return edit.Put(key, copy) != 0; })) return 0;
+    if (!Edit(kTitle, [&](CEditScope& edit) { return edit.Put(key, copy) != 0; })) return 0;
     m_selected = key;
     return 1;
 }
@@ -50,7 +50,7 @@ int CPO_LoadCaseListDlg::OnCopy()
 int CPO_LoadCaseListDlg::OnDelete()
 {
     if (!CheckChoice()) return 0;
-    const auto erase = [&](CEditData& edit) {
+    const auto erase = [&](CEditScope& edit) {
         T_RECORD_USERS users;
         if (edit.Erase<T_POLC_D>(m_selected, users)) return true;
         std::string names;

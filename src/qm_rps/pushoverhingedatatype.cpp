@@ -2,6 +2,7 @@
 
 #include "qm_rps/hinge/curvefindings.h"
 #include "qm_rps/hinge/hingemirror.h"
+#include "qm_rps/hinge/hingetable.h"
 #include "qm_rps/po_hingetypelistdlg.h"
 
 #include <algorithm>
@@ -17,23 +18,24 @@ constexpr std::size_t kOrigin = 4; // the row of A
 
 int CPushOverHingeDataType::Data2Dlg(int key, HINGE_COMPONENT component)
 {
-    const std::optional<T_PHGT_D> type = key != 0 && m_find ? m_find(key) : std::nullopt;
-    if (const auto fault = CPO_HingeTypeListDlg::ChoiceFault(key, type.has_value())) {
+    T_PHGT_D type;
+    const bool exists = m_doc.Attr().GetPhgt(key, type) != 0;
+    if (const auto fault = CPO_HingeTypeListDlg::ChoiceFault(key, exists)) {
         ShowMessage(fault->key, fault->text);
         return 0;
     }
-    const T_HINGE_COMPONENT& c = At(*type, component);
+    const T_HINGE_COMPONENT& c = At(type, component);
     if (!std::holds_alternative<T_SKEL_FEMA>(c.curves.I)) return 0;
     m_key = key;
     m_component = component;
-    m_type = m_given = *type;
+    m_type = m_given = type;
     m_taken = true;
     return 1;
 }
 
 int CPushOverHingeDataType::ChooseFirst()
 {
-    const T_TABLE<T_PHGT_D> types = m_types ? m_types() : T_TABLE<T_PHGT_D>{};
+    const T_TABLE<T_PHGT_D>& types = m_doc.Data().Model().hingeTypes;
     for (const auto& [key, type] : types)
         for (std::size_t c = 0; c < type.components.size(); ++c)
             if (type.components[c].active && type.components[c].type == SKEL_TYPE::Fema)
@@ -111,11 +113,12 @@ int CPushOverHingeDataType::OnOK()
 {
     if (!m_taken) ShowMessage("IDS_QM_UI_HINGE_NO_FEMA");
     if (!m_taken || !CheckData()) return 0;
-    if (const auto fault = CPO_HingeTypeListDlg::ChoiceFault(m_key, m_find(m_key).has_value())) {
+    const bool exists = m_doc.Data().Model().hingeTypes.contains(m_key);
+    if (const auto fault = CPO_HingeTypeListDlg::ChoiceFault(m_key, exists)) {
         ShowMessage(fault->key, fault->text);
         return 0;
     }
     T_HINGE_COMPONENT& c = At(m_type, m_component);
     c = MirroredComponent(c);
-    return m_store ? m_store(m_key, m_type) : 0;
+    return StoreHingeType(m_doc, m_key, m_type);
 }

@@ -4,11 +4,8 @@
 #pragma once
 
 #include "qm_base/checkeddialog.h"
-#include "qm_db/records.h"
+#include "qm_db/dbdoc.h"
 #include "qm_rps/hinge/hingelabels.h"
-
-#include <functional>
-#include <optional>
 
 class CPushOverHingeDataType : public CCheckedDialog {
 public:
@@ -18,12 +15,9 @@ public:
     /// Names of the criteria.
     static constexpr std::array<const char*, 3> kCriteria{"IO", "LS", "CP"};
 
-    /// The type of a key, or none; and how it is stored (1 done).
-    std::function<std::optional<T_PHGT_D>(int key)> m_find;
-    std::function<int(int key, const T_PHGT_D&)> m_store;
-
-    std::function<T_TABLE<T_PHGT_D>()> m_types; // all hinge types by key
-    T_UNITS m_units;
+    /// The document must outlive the editor; values are in its current units.
+    explicit CPushOverHingeDataType(CDBDoc& doc) : m_doc(doc) {}
+    CDBDoc& Doc() const { return m_doc; }
 
     /// Chooses the first FEMA curve of the document, or its first type where there is none. 0 with
     /// a message: the document has no hinge type.
@@ -35,7 +29,7 @@ public:
     HINGE_COMPONENT ComponentOnShow() const { return m_component; }
     bool IsTaken() const { return m_taken; }
     bool IsSymmetric() const;
-    T_HINGE_OWNER Owner() const { return {m_type, m_units}; }
+    T_HINGE_OWNER Owner() const { return {m_type, m_doc.Unit().Units()}; }
     /// The curve as edited, or null.
     const T_SKEL_FEMA* Shown() const;
     /// After each edit: the negative side of a symmetric curve follows the positive one.
@@ -60,6 +54,7 @@ public:
 private:
     T_SKEL_FEMA* Curve();
 
+    CDBDoc& m_doc;
     int m_key = 0;
     HINGE_COMPONENT m_component = HINGE_COMPONENT::My;
     T_PHGT_D m_type;

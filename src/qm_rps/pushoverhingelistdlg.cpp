@@ -2,6 +2,8 @@
 
 #include "qm_base/appbase.h"
 #include "qm_base/msgfunction.h"
+#include "qm_rps/hinge/hingegenerator.h"
+#include "qm_rps/hinge/hingetable.h"
 #include "qm_rps/po_hingetypelistdlg.h"
 
 using zql::lib::MMSGFunction;
@@ -60,9 +62,8 @@ std::vector<std::string> CPushOverHingeListDlg::Heads()
 std::vector<CPushOverHingeListDlg::T_ROW> CPushOverHingeListDlg::Rows(bool crack) const
 {
     std::vector<T_ROW> rows;
-    if (!m_hinges || !m_types) return rows;
-    const T_TABLE<T_PHGT_D> types = m_types();
-    for (const auto& [key, hinge] : m_hinges()) {
+    const T_TABLE<T_PHGT_D> types = HingeTypesOf(m_doc);
+    for (const auto& [key, hinge] : HingesOf(m_doc)) {
         const auto type = types.find(hinge.hingeType);
         const std::string name =
             type == types.end() ? MMSGFunction::GetValue("IDS_PUSHOVER_Error") : type->second.name;
@@ -78,7 +79,7 @@ int CPushOverHingeListDlg::CheckData()
         ShowMessage("IDS_PUSHOVER_No_selected_Hinge_Data__nChoose_one_an");
         return 0;
     }
-    if (m_hinges && m_hinges().count(m_selected)) return 1;
+    if (m_doc.Data().Model().hinges.contains(m_selected)) return 1;
     constexpr const char* gone = "IDS_PUSHOVER_Generated_Hinge_key__d_does_not_exits_";
     ShowMessage(gone, MMSGFunction::Format(gone, {std::to_string(m_selected)}));
     return 0;
@@ -86,8 +87,7 @@ int CPushOverHingeListDlg::CheckData()
 
 std::optional<HINGE_ELEMENT> CPushOverHingeListDlg::TypeElement() const
 {
-    if (!m_types) return std::nullopt;
-    const T_TABLE<T_PHGT_D> types = m_types();
+    const T_TABLE<T_PHGT_D>& types = m_doc.Data().Model().hingeTypes;
     const auto type = types.find(m_type);
     return type == types.end() ? std::nullopt : std::optional(type->second.element);
 }
@@ -103,7 +103,7 @@ std::vector<int> CPushOverHingeListDlg::Elements() const
 {
     if (m_options.selectedOnly) return m_options.elements;
     const std::optional<HINGE_ELEMENT> element = TypeElement();
-    return element && m_elements ? m_elements(*element) : std::vector<int>();
+    return element ? ElementsForHinges(m_doc, *element) : std::vector<int>();
 }
 
 int CPushOverHingeListDlg::OnOptionBtn()
@@ -115,12 +115,9 @@ int CPushOverHingeListDlg::OnOptionBtn()
     }
     // Walls are elements of beams in the model.
     const bool wall = *element == HINGE_ELEMENT::Wall;
-    CYieldStrengthCalcOptDlg dlg(wall ? HINGE_ELEMENT::BeamColumn : *element);
+    CYieldStrengthCalcOptDlg dlg(m_doc, wall ? HINGE_ELEMENT::BeamColumn : *element);
     dlg.SetView(View());
-    dlg.m_units = m_units;
-    dlg.m_kindOf = m_kindOf;
     dlg.SetData(m_options);
-    if (m_elements) dlg.SetElements(m_elements(*element), m_lookup);
     if (!dlg.DoModal()) return 0;
     dlg.GetData(m_options);
     return 1;
@@ -132,17 +129,16 @@ int CPushOverHingeListDlg::OnGenerate()
         ShowMessage(fault->key, fault->text);
         return 0;
     }
-    std::string refusal;
-    if (m_generate && m_generate(m_type, Elements(), refusal)) return 1;
-    ShowMessage("IDS_QM_HINGE_NOT_STORED",
-                refusal.empty() ? MMSGFunction::GetValue("IDS_QM_HINGE_NOT_STORED") : refusal);
+    T_HINGE_REFUSAL refusal;
+    if (CHingeGenerator(m_doc).Generate(m_type, Elements(), refusal)) return 1;
+    ShowMessage("IDS_QM_HINGE_NOT_STORED", refusal.text);
     return 0;
 }
 
 int CPushOverHingeListDlg::OnDelete()
 {
     if (!CheckData()) return 0;
-    if (!m_erase || !m_erase(m_selected)) {
+    if (!EraseHinge(m_doc, m_selected)) {
         ShowMessage("IDS_QM_HINGE_NOT_STORED");
         return 0;
     }

@@ -2,14 +2,15 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_db/records.h"
 #include "qm_rps/yieldstrengthcalcoptdlg.h"
 
-#include <functional>
 #include <vector>
 
 class CPushOverHingeListDlg : public zql::frx::MDialog {
 public:
+    /// The document must outlive the list; strengths are in its current units.
+    explicit CPushOverHingeListDlg(CDBDoc& doc) : m_doc(doc) {}
+
     /// Text of the interaction kind 0 to 4; another code is an assertion failure and an empty text.
     static std::string InteractionText(int code);
     /// Text of the curve family: 0 multilinear, 1 FEMA; any other is shown as an error.
@@ -31,22 +32,12 @@ public:
     /// The hinges by key with their crack or yield strengths.
     std::vector<T_ROW> Rows(bool crack) const;
 
-    std::function<T_TABLE<T_PHGE_D>()> m_hinges; // all generated hinges by key
-    std::function<T_TABLE<T_PHGT_D>()> m_types;  // all hinge types by key
-    int m_selected = 0;                          // key of the chosen hinge; 0: none
+    CDBDoc& Doc() const { return m_doc; }
+    int m_selected = 0; // key of the chosen hinge; 0: none
 
     /// The chosen hinge exists. 0 with a message otherwise.
     int CheckData() override;
 
-    /// Hinges of a type for elements; 1 stored, 0 with the reason. Deletes a hinge; 1 deleted.
-    std::function<int(int type, const std::vector<int>& elements, std::string& refusal)> m_generate;
-    std::function<int(int key)> m_erase;
-    /// Elements of the document that hinges of such a type can be for, ascending; the kind of an
-    /// element; its section and material.
-    std::function<std::vector<int>(HINGE_ELEMENT)> m_elements;
-    std::function<std::optional<HINGE_ELEMENT>(int id)> m_kindOf;
-    T_YIELD_CALC_LOOKUP m_lookup;
-    T_UNITS m_units;      // of the strengths
     bool m_crack = false; // crack strengths are shown, else yield strengths
     int m_type = 0;       // key of the type of new hinges; 0: none
 
@@ -64,5 +55,6 @@ public:
 private:
     std::optional<HINGE_ELEMENT> TypeElement() const;
 
+    CDBDoc& m_doc;
     T_YIELD_CALC_OPT m_options;
 };

@@ -19,14 +19,9 @@ void CRPSDlgBase::RefreshWindow()
     if (m_window) m_window->Refresh();
 }
 
-int CRPSDlgBase::Edit(const char* titleKey, const std::function<bool(CEditData&)>& change)
+int CRPSDlgBase::Edit(const char* titleKey, const std::function<bool(CEditScope&)>& change)
 {
-    CEditData& edit = m_doc->Edit();
-    if (!edit.Begin(zql::lib::MMSGFunction::GetValue(titleKey))) {
-        ShowMessage("IDS_QM_UI_EDIT_BUSY");
-        return 0;
-    }
-    if (change(edit) && edit.Commit()) return 1;
-    edit.Rollback();
-    return 0;
+    CEditScope edit(*m_doc, zql::lib::MMSGFunction::GetValue(titleKey));
+    if (!edit.IsOpen()) ShowMessage("IDS_QM_UI_EDIT_BUSY");
+    return edit.IsOpen() && change(edit) && edit.Commit();
 }

@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_base/checkeddialog.h"
-#include "qm_db/dbdoc.h"
+#include "qm_db/editscope.h"
 
 #include <functional>
 #include <memory>
@@ -43,7 +43,7 @@ public:
 protected:
     /// Runs a change of the document as one edit that can be undone, whole or not at all. 0 also
     /// where another edit is open, with a message.
-    int Edit(const char* titleKey, const std::function<bool(CEditData&)>& change);
+    int Edit(const char* titleKey, const std::function<bool(CEditScope&)>& change);
 
 private:
     CDBDoc* m_doc = nullptr;

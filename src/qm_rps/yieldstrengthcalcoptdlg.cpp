@@ -2,7 +2,9 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_rps/desk/elementlist.h"
+#include "qm_rps/hinge/hingetable.h"
 #include "qm_rps/yieldstrengthcalcopteffdescdlg.h"
+#include "qm_rps/yieldstrengthcalcoptmatdescdlg.h"
 
 #include <algorithm>
 
@@ -33,7 +35,7 @@ int CYieldStrengthCalcOptDlg::OnSelectionText(const std::string& text)
     }
     std::vector<T_SELECTED_ELEM> selection;
     for (const int id : *ids) {
-        const std::optional<HINGE_ELEMENT> kind = m_kindOf ? m_kindOf(id) : std::nullopt;
+        const std::optional<HINGE_ELEMENT> kind = HingeElementOf(m_doc, id);
         if (!kind) {
             const std::string why = zql::lib::MMSGFunction::GetValue("IDS_CMD_IEHP_NO_ELEM");
             ShowMessage(
@@ -51,24 +53,21 @@ std::string CYieldStrengthCalcOptDlg::SelectionText() const
     return ElementListText(m_data.elements);
 }
 
-void CYieldStrengthCalcOptDlg::SetElements(std::vector<int> elements, T_YIELD_CALC_LOOKUP lookup)
+std::vector<int> CYieldStrengthCalcOptDlg::Elements() const
 {
-    m_all = std::move(elements);
-    m_lookup = std::move(lookup);
+    return m_data.selectedOnly ? m_data.elements : ElementsForHinges(m_doc, m_element);
 }
 
 int CYieldStrengthCalcOptDlg::OnMatlDescBtn()
 {
-    CYieldStrengthCalcOptMatDescDlg dlg(Elements(), m_lookup);
-    dlg.m_units = m_units;
+    CYieldStrengthCalcOptMatDescDlg dlg(m_doc, Elements());
     dlg.SetView(View());
     return dlg.DoModal();
 }
 
 int CYieldStrengthCalcOptDlg::OnEffeDescBtn()
 {
-    CYieldStrengthCalcOptEffDescDlg dlg(Elements(), m_lookup);
-    dlg.m_units = m_units;
+    CYieldStrengthCalcOptEffDescDlg dlg(m_doc, Elements());
     dlg.SetView(View());
     return dlg.DoModal();
 }

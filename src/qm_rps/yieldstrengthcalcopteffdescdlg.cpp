@@ -4,6 +4,7 @@
 #include "qm_base/textformat.h"
 #include "qm_db/sectionproperties.h"
 #include "qm_rps/hinge/hingelabels.h"
+#include "qm_rps/hinge/hingetable.h"
 
 namespace {
 
@@ -28,13 +29,14 @@ constexpr T_PROPERTY kProperties[] = {
 
 } // namespace
 
-CYieldStrengthCalcOptEffDescDlg::CYieldStrengthCalcOptEffDescDlg(const std::vector<int>& elements,
-                                                                 const T_YIELD_CALC_LOOKUP& lookup)
+CYieldStrengthCalcOptEffDescDlg::CYieldStrengthCalcOptEffDescDlg(CDBDoc& doc,
+                                                                 const std::vector<int>& elements)
+    : m_units(doc.Unit().Units())
 {
     for (const int element : elements) {
         T_ROW& row = m_rows.emplace_back();
         row.element = element;
-        const T_YIELD_CALC_ELEM found = lookup ? lookup(element) : T_YIELD_CALC_ELEM{};
+        const T_YIELD_CALC_ELEM found = YieldCalcElemOf(doc, element);
         if (!found.section) {
             row.faultKey = "IDS_CMD_IEHP_NO_SECT";
             continue;

@@ -1,12 +1,12 @@
 // Model of the description of the effective section properties: the properties of the section times
-// its stiffness factors at the I-end and the J-end, in the caller's units.
+// its stiffness factors at the I-end and the J-end, in the document's current units.
 #pragma once
 
-#include "qm_rps/yieldstrengthcalcoptmatdescdlg.h"
+#include "qm_base/mdialog.h"
+#include "qm_db/dbdoc.h"
 
 class CYieldStrengthCalcOptEffDescDlg : public zql::frx::MDialog {
 public:
-    T_UNITS m_units; // for the heads
     /// What the numbers mean.
     static constexpr const char* kNoteKey = "IDS_QM_YSCO_SECTION";
     struct T_ROW {
@@ -19,8 +19,7 @@ public:
         bool operator==(const T_ROW&) const = default;
     };
 
-    CYieldStrengthCalcOptEffDescDlg(const std::vector<int>& elements,
-                                    const T_YIELD_CALC_LOOKUP& lookup);
+    CYieldStrengthCalcOptEffDescDlg(CDBDoc& doc, const std::vector<int>& elements);
     const std::vector<T_ROW>& Rows() const { return m_rows; }
     /// The rows as a table with units in its heads; where something is missing the last cell says
     /// what.
@@ -28,5 +27,6 @@ public:
     std::vector<std::string> Cells(std::size_t row) const;
 
 private:
+    T_UNITS m_units; // for the heads
     std::vector<T_ROW> m_rows;
 };

@@ -3,14 +3,16 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/hinge/hingelabels.h"
+#include "qm_rps/hinge/hingetable.h"
 
-CYieldStrengthCalcOptMatDescDlg::CYieldStrengthCalcOptMatDescDlg(const std::vector<int>& elements,
-                                                                 const T_YIELD_CALC_LOOKUP& lookup)
+CYieldStrengthCalcOptMatDescDlg::CYieldStrengthCalcOptMatDescDlg(CDBDoc& doc,
+                                                                 const std::vector<int>& elements)
+    : m_units(doc.Unit().Units())
 {
     for (const int element : elements) {
         T_ROW& row = m_rows.emplace_back();
         row.element = element;
-        const T_YIELD_CALC_ELEM found = lookup ? lookup(element) : T_YIELD_CALC_ELEM{};
+        const T_YIELD_CALC_ELEM found = YieldCalcElemOf(doc, element);
         if (!found.material) {
             row.faultKey = "IDS_CMD_IEHP_NO_MATL";
             continue;

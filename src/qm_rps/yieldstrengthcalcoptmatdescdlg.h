@@ -1,22 +1,14 @@
 // Model of the description of the material strengths that a yield strength calculation uses.
-// Characteristic values without partial factors, in the caller's units.
+// Characteristic values without partial factors, in the document's current units.
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_db/records.h"
+#include "qm_db/dbdoc.h"
 
-#include <functional>
-
-/// Section and material of an element; null what it lacks.
-struct T_YIELD_CALC_ELEM {
-    std::optional<T_SECT_D> section;
-    std::optional<T_MATL_D> material;
-};
-using T_YIELD_CALC_LOOKUP = std::function<T_YIELD_CALC_ELEM(int element)>;
+#include <optional>
 
 class CYieldStrengthCalcOptMatDescDlg : public zql::frx::MDialog {
 public:
-    T_UNITS m_units; // for the heads
     /// What the numbers mean.
     static constexpr const char* kNoteKey = "IDS_QM_YSCO_MATERIAL";
     /// Strengths that the material's class uses; the others are empty.
@@ -31,8 +23,7 @@ public:
         bool operator==(const T_ROW&) const = default;
     };
 
-    CYieldStrengthCalcOptMatDescDlg(const std::vector<int>& elements,
-                                    const T_YIELD_CALC_LOOKUP& lookup);
+    CYieldStrengthCalcOptMatDescDlg(CDBDoc& doc, const std::vector<int>& elements);
     const std::vector<T_ROW>& Rows() const { return m_rows; }
     /// The rows as a table with units in its heads; where something is missing the last cell says
     /// what.
@@ -40,5 +31,6 @@ public:
     std::vector<std::string> Cells(std::size_t row) const;
 
 private:
+    T_UNITS m_units; // for the heads
     std::vector<T_ROW> m_rows;
 };

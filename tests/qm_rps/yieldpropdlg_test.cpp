@@ -142,7 +142,8 @@ TEST(YieldPropGrid, ShowsRatiosOrValuesAndStoresRatios)
 
 TEST(YieldStrengthCalcOpt, RefusesASelectionOfAnotherKind)
 {
-    CYieldStrengthCalcOptDlg dlg(HINGE_ELEMENT::BeamColumn);
+    CDBDoc doc;
+    CYieldStrengthCalcOptDlg dlg(doc, HINGE_ELEMENT::BeamColumn);
     EXPECT_EQ(1, dlg.OnSelectElemChk(true, {{7}, {3}}));
     const T_YIELD_CALC_OPT selected{true, {3, 7}};
     EXPECT_EQ(selected, dlg.Data());

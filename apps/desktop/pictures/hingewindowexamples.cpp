@@ -2,7 +2,6 @@
 #include "hingetools.h"
 #include "mainwindow.h"
 
-#include "qm_rps/hingedocument.h"
 #include "qm_rps/po_hingealphayspandlg.h"
 #include "qm_rps/po_hingeintegrationpointdlg.h"
 #include "qm_rps/po_hingelengthmphidlg.h"
@@ -13,9 +12,13 @@
 #include "qm_rps/po_hingeskcvtabfemaaxialgrid.h"
 #include "qm_rps/po_hingeskcvtabfemadlg.h"
 #include "qm_rps/po_hingetypedlg.h"
+#include "qm_rps/po_hingetypelistdlg.h"
 #include "qm_rps/po_hingeyieldpropdlgnew.h"
+#include "qm_rps/pushoverhingedatatype.h"
+#include "qm_rps/pushoverhingelistdlg.h"
 #include "qm_rps/pushoverpmminteractiondlg.h"
 #include "qm_rps/yieldstrengthcalcopteffdescdlg.h"
+#include "qm_rps/yieldstrengthcalcoptmatdescdlg.h"
 #include "qm_ui/form/dialogwindow.h"
 
 namespace {
@@ -121,16 +124,14 @@ std::unique_ptr<QWidget> InteractionWindow(CMainWindow& main)
 
 std::unique_ptr<QWidget> GeneratedWindow(CMainWindow& main)
 {
-    auto dlg = std::make_unique<CPushOverHingeListDlg>();
-    ConnectHinges(main.Doc(), *dlg);
+    auto dlg = std::make_unique<CPushOverHingeListDlg>(main.Doc());
     dlg->m_type = kColumn;
     return WindowOf(main, std::move(dlg));
 }
 
 std::unique_ptr<QWidget> TableWindow(CMainWindow& main)
 {
-    auto dlg = std::make_unique<CPushOverHingeDataType>();
-    ConnectHinges(main.Doc(), *dlg);
+    auto dlg = std::make_unique<CPushOverHingeDataType>(main.Doc());
     (void)dlg->ChooseFirst();
     return WindowOf(main, std::move(dlg));
 }
@@ -138,16 +139,12 @@ std::unique_ptr<QWidget> TableWindow(CMainWindow& main)
 template <class DLG>
 std::unique_ptr<QWidget> DescriptionWindow(CMainWindow& main)
 {
-    CPushOverHingeListDlg list;
-    ConnectHinges(main.Doc(), list);
-    auto dlg = std::make_unique<DLG>(std::vector<int>{1, 2, 3}, list.m_lookup);
-    dlg->m_units = list.m_units;
-    return WindowOf(main, std::move(dlg));
+    return WindowOf(main, std::make_unique<DLG>(main.Doc(), std::vector<int>{1, 2, 3}));
 }
 
 std::unique_ptr<QWidget> ListWindow(CMainWindow& main)
 {
-    auto dlg = std::make_unique<CPO_HingeTypeListDlg>(HingeTypesOf(main.Doc()));
+    auto dlg = std::make_unique<CPO_HingeTypeListDlg>(main.Doc());
     dlg->m_selected = kColumn;
     return WindowOf(main, std::move(dlg));
 }
@@ -210,7 +207,10 @@ std::vector<T_WINDOW_EXAMPLE> HingeWindowExamples()
         {"hinge-masonry", kModel, MasonryWindow},
         {"hinges-generated", kModel, GeneratedWindow},
         {"hinge-strength-options", kModel,
-         [](CMainWindow& m) { return PartWindow<CYieldStrengthCalcOptDlg>(m, [](auto&) {}); }},
+         [](CMainWindow& m) {
+             return WindowOf(
+                 m, std::make_unique<CYieldStrengthCalcOptDlg>(m.Doc(), HINGE_ELEMENT::BeamColumn));
+         }},
         {"hinge-materials", kModel, DescriptionWindow<CYieldStrengthCalcOptMatDescDlg>},
         {"hinge-sections", kModel, DescriptionWindow<CYieldStrengthCalcOptEffDescDlg>},
         {"hinge-table", kModel, TableWindow},

@@ -1,6 +1,7 @@
 #include "qm_rps/hinge/hingegenerator.h"
 
 #include "qm_base/msgfunction.h"
+#include "qm_db/editscope.h"
 #include "qm_rps/hinge/hingetypefindings.h"
 
 #include <set>
@@ -121,21 +122,18 @@ int CHingeGenerator::Generate(int hingeType, const std::vector<int>& elements,
 
     std::set<int> extra;
     std::map<int, int> keys; // of the hinges that are replaced, by element
-    int next = 1;
-    for (const auto& [key, hinge] : m_doc.Data().Model().hinges) {
-        next = key + 1;
+    int next = NextKey(m_doc.Data().Model().hinges);
+    for (const auto& [key, hinge] : m_doc.Data().Model().hinges)
         if (fresh.contains(hinge.element) && !keys.emplace(hinge.element, key).second)
             extra.insert(key);
-    }
-    bool done = m_doc.Edit().Begin("hinges of elements");
+    CEditScope edit(m_doc, "hinges of elements");
     for (const int key : extra)
-        done = done && m_doc.Edit().Erase<T_PHGE_D>(key);
+        (void)edit.Erase<T_PHGE_D>(key);
     for (const auto& [element, hinge] : fresh) {
         const auto old = keys.find(element);
-        done = done && m_doc.Edit().Put(old == keys.end() ? next++ : old->second, hinge);
+        (void)edit.Put(old == keys.end() ? next++ : old->second, hinge);
     }
-    if (done && m_doc.Edit().Commit()) return 1;
-    m_doc.Edit().Rollback();
+    if (edit.Commit()) return 1;
     return Refuse(0, "IDS_QM_HINGE_NOT_STORED", refusal);
 }
 

@@ -64,26 +64,25 @@ void BuildTypeList(CFormView& form, CPO_HingeTypeListDlg& dlg)
 }
 
 /// The types of a document as a choice.
-T_BINDING<int> TypeOf(std::function<T_TABLE<T_PHGT_D>()> types, std::function<int()> key,
-                      std::function<void(int)> choose)
+T_BINDING<int> TypeOf(CDBDoc& doc, std::function<int()> key, std::function<void(int)> choose)
 {
-    return {[types, key] {
-                const auto all = types();
+    return {[&doc, key] {
+                const auto& all = doc.Data().Model().hingeTypes;
                 const auto at = all.find(key());
                 return at == all.end() ? -1 : static_cast<int>(std::distance(all.begin(), at));
             },
-            [types, choose](const int& index) {
-                const auto all = types();
+            [&doc, choose](const int& index) {
+                const auto& all = doc.Data().Model().hingeTypes;
                 if (index < static_cast<int>(all.size()))
                     choose(std::next(all.begin(), index)->first);
             }};
 }
 
-std::function<std::vector<std::string>()> TypeTexts(std::function<T_TABLE<T_PHGT_D>()> types)
+std::function<std::vector<std::string>()> TypeTexts(CDBDoc& doc)
 {
-    return [types] {
+    return [&doc] {
         std::vector<std::string> texts;
-        for (const auto& [key, type] : types())
+        for (const auto& [key, type] : doc.Data().Model().hingeTypes)
             texts.push_back(CPO_HingeTypeListDlg::NameOf(key, type.name));
         return texts;
     };
@@ -100,10 +99,10 @@ T_GRID_BINDING HingeGrid(CPushOverHingeListDlg& dlg)
     for (std::size_t i = 0; i < heads.size(); ++i)
         b.columns.push_back({[&dlg, head = heads[i], i] {
                                  return HingeHead(head, i < 6 ? kDimForce : kDimMoment,
-                                                  dlg.m_units);
+                                                  dlg.Doc().Unit().Units());
                              },
                              CELL_KIND::Number});
-    b.rows = [&dlg] { return dlg.m_hinges().size(); };
+    b.rows = [&dlg] { return dlg.Doc().Data().Model().hinges.size(); };
     b.text = [&dlg](std::size_t row, std::size_t c) {
         const CPushOverHingeListDlg::T_ROW r = dlg.Rows(dlg.m_crack).at(row);
         if (c == 0) return std::to_string(r.key);
@@ -114,7 +113,7 @@ T_GRID_BINDING HingeGrid(CPushOverHingeListDlg& dlg)
     };
     BindSelection(b, dlg, [&dlg] {
         std::vector<int> keys;
-        for (const auto& entry : dlg.m_hinges())
+        for (const auto& entry : dlg.Doc().Data().Model().hinges)
             keys.push_back(entry.first);
         return keys;
     });
@@ -140,9 +139,9 @@ void BuildHingeList(CFormView& form, CPushOverHingeListDlg& dlg)
     form.Group(KeyText("IDS_QM_UI_HINGE_GENERATE_GROUP"));
     form.Choice(KeyText("IDS_QM_UI_HEAD_HINGE_TYPE"),
                 TypeOf(
-                    dlg.m_types, [&dlg] { return dlg.m_type; },
+                    dlg.Doc(), [&dlg] { return dlg.m_type; },
                     [&dlg](int key) { dlg.OnSelChangeType(key); }),
-                TypeTexts(dlg.m_types))
+                TypeTexts(dlg.Doc()))
         .name = "type";
     form.Note([&dlg] {
         return MMSGFunction::Format("IDS_QM_UI_HINGE_FOR_ELEMENTS",
@@ -226,9 +225,9 @@ void BuildTable(CFormView& form, TABLE& dlg)
     form.Columns();
     form.Choice(KeyText("IDS_QM_UI_HEAD_HINGE_TYPE"),
                 TypeOf(
-                    dlg.m_types, [&dlg] { return dlg.Key(); },
+                    dlg.Doc(), [&dlg] { return dlg.Key(); },
                     [&dlg](int key) { dlg.OnSelChange(key, dlg.ComponentOnShow()); }),
-                TypeTexts(dlg.m_types))
+                TypeTexts(dlg.Doc()))
         .name = "type";
     form.Choice(
             KeyText("IDS_QM_UI_HINGE_COMPONENT"),

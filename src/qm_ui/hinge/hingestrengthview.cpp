@@ -1,5 +1,6 @@
 #include "qm_rps/yieldstrengthcalcoptdlg.h"
 #include "qm_rps/yieldstrengthcalcopteffdescdlg.h"
+#include "qm_rps/yieldstrengthcalcoptmatdescdlg.h"
 #include "qm_ui/hinge/hingefieldsview.h"
 #include "qm_ui/hinge/hingeviews.h"
 

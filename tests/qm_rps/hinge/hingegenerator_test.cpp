@@ -1,9 +1,12 @@
 // Hinges generated for elements, their list, and what an element lacks.
 #include "hingesample.h"
+#include "qm_db/editscope.h"
 #include "qm_rps/hinge/hingegenerator.h"
+#include "qm_rps/hinge/hingetable.h"
 #include "qm_rps/pushoverhingedatatype.h"
 #include "qm_rps/pushoverhingelistdlg.h"
 #include "qm_rps/yieldstrengthcalcopteffdescdlg.h"
+#include "qm_rps/yieldstrengthcalcoptmatdescdlg.h"
 
 #include <gtest/gtest.h>
 
@@ -74,19 +77,17 @@ TEST(HingeGenerator, GivesElementsTheirStrengthsAsOneEdit)
     ASSERT_EQ(1, doc.Attr().GetPhge(1, hinge));
     EXPECT_EQ((T_SIDES<double>{5, 4}), hinge.crack[2]);
 
-    CPushOverHingeListDlg list;
-    list.m_hinges = [&] { return T_TABLE<T_PHGE_D>{{1, hinge}, {2, T_PHGE_D{1, 9, {}, {}}}}; };
-    list.m_types = [&] { return doc.Data().Model().hingeTypes; };
+    const CPushOverHingeListDlg list(doc);
     EXPECT_EQ("1 : column", list.Rows(true)[0].type);
     EXPECT_EQ((T_SIDES<double>{5, 4}), list.Rows(true)[0].strengths[2]);
     EXPECT_EQ((T_SIDES<double>{8, 7}), list.Rows(false)[0].strengths[2]);
-    EXPECT_EQ("9 : Error", list.Rows(false)[1].type);
 
     // Another hinge of the element goes when it is generated again, the first keeps its key.
     ASSERT_EQ(1, doc.Edit().Begin("second"));
     for (const auto& [key, element] : {std::pair(5, 1), std::pair(6, 4), std::pair(7, 4)})
-        ASSERT_EQ(1, doc.Edit().Put(key, T_PHGE_D{element, 3, {}, {}}));
+        ASSERT_EQ(1, doc.Edit().Put(key, T_PHGE_D{element, 9, {}, {}}));
     ASSERT_EQ(1, doc.Edit().Commit());
+    EXPECT_EQ("9 : Error", list.Rows(false)[1].type);
     ASSERT_EQ(1, CHingeGenerator(doc).Generate(1, {1}, refusal));
     EXPECT_EQ(3u, doc.Data().Model().hinges.size()); // 1, and both of element 4
     EXPECT_FALSE(doc.Data().Model().hinges.contains(5));
@@ -143,66 +144,57 @@ TEST(HingeDataType, ChecksTheDiagramBeforeTheCriteria)
 {
     constexpr const char* kDiagram = "IDS_PUSHOVER_Wrong_Data_in_the_Hinge_Diagram_Table_";
     constexpr const char* kCriteria = "IDS_PUSHOVER_Wrong_Data_in_Acceptance_Criteria_";
-    T_PHGT_D stored;
-    stored.components[4] = ComponentWith(SKEL_TYPE::Fema, ValidBackbone<T_SKEL_FEMA>());
+    CDBDoc doc;
+    T_PHGT_D type;
+    type.components[4] = ComponentWith(SKEL_TYPE::Fema, ValidBackbone<T_SKEL_FEMA>());
+    ASSERT_EQ(1, StoreHingeType(doc, 3, type));
+    using DLG = CPushOverHingeDataType;
     const struct {
         int key;
-        void (*edit)(CPushOverHingeDataType&);
+        void (*edit)(DLG&);
         const char* message; // empty: stored
     } kCases[] = {
-        {0, [](auto&) {}, "IDS_PUSHOVER_No_selected_Hinge_Data_Type__nChoose_o"},
-        {4, [](auto&) {}, "IDS_PUSHOVER_Hinge_Data_Type_key__d_does_not_exits_"},
-        {3,
-         [](auto& d) {
-             *d.Point(6) = {6.001, 1.3}, *d.Criterion(1, true) = 7;
-         },
-         kDiagram},
-        {3,
-         [](auto& d) {
-             *d.Point(0) = {-4.99, -0.3};
-         },
-         kDiagram},                                          // -E inside -D
-        {3, [](auto& d) { *d.Criterion(1, true) = 6; }, ""}, // LS = CP
-        {3, [](auto& d) { *d.Criterion(1, true) = 6.001; }, kCriteria},
-        {3, [](auto& d) { *d.Criterion(0, false) = -3.001; }, kCriteria},
-        {3,
-         [](auto& d) {
-             *d.Point(6) = {6, 1.3};
-         },
-         ""},
+        {0, [](DLG&) {}, "IDS_PUSHOVER_No_selected_Hinge_Data_Type__nChoose_o"},
+        {4, [](DLG&) {}, "IDS_PUSHOVER_Hinge_Data_Type_key__d_does_not_exits_"},
+        {3, [](DLG& d) { d.Point(6)->deform = 6.001, *d.Criterion(1, true) = 7; }, kDiagram},
+        {3, [](DLG& d) { d.Point(0)->deform = -4.99; }, kDiagram}, // -E inside -D
+        {3, [](DLG& d) { *d.Criterion(1, true) = 6; }, ""},        // LS = CP
+        {3, [](DLG& d) { *d.Criterion(1, true) = 6.001; }, kCriteria},
+        {3, [](DLG& d) { *d.Criterion(0, false) = -3.001; }, kCriteria},
+        {3, [](DLG& d) { d.Point(6)->strength = 1.3; }, ""},
     };
+    const auto stored = [&] { return doc.Data().Model().hingeTypes.at(3); };
     for (const auto& c : kCases) {
         SCOPED_TRACE(&c - kCases);
-        CPushOverHingeDataType dlg;
-        dlg.m_find = [&](int key) { return key == 3 ? std::optional(stored) : std::nullopt; };
-        dlg.m_store = [&](int, const T_PHGT_D& t) { return stored = t, 1; };
-        const T_PHGT_D before = stored;
+        DLG dlg(doc);
+        const T_PHGT_D before = stored();
         const bool opened = dlg.Data2Dlg(c.key, HINGE_COMPONENT::My);
         if (opened) c.edit(dlg);
         EXPECT_EQ(!*c.message, opened && dlg.OnOK());
-        EXPECT_EQ(!*c.message, before != stored);
+        EXPECT_EQ(!*c.message, before != stored());
         EXPECT_EQ(c.message, dlg.Messages().empty() ? "" : dlg.Messages().back().key);
     }
-    EXPECT_EQ(1.3, std::get<T_SKEL_FEMA>(stored.components[4].curves.J).sides.pos.C.strength);
+    EXPECT_EQ(1.3, std::get<T_SKEL_FEMA>(stored().components[4].curves.J).sides.pos.C.strength);
 }
 
 TEST(YieldStrengthCalcOpt, DescribesStrengthsAndEffectiveSections)
 {
+    CDBDoc doc;
     T_SECT_D s;
     s.name = "S", s.area = 6, s.Iyy = 2, s.Zy = 3, s.factorsJ.Iyy = 0.5;
     T_MATL_D concrete;
     concrete.name = "C", concrete.type = MATL_CLASS::Concrete;
     concrete.fck = 25, concrete.fyk = 450;
-    const T_YIELD_CALC_LOOKUP lookup = [&](int e) {
-        return e == 1 ? T_YIELD_CALC_ELEM{s, concrete} : T_YIELD_CALC_ELEM{};
-    };
-    const CYieldStrengthCalcOptMatDescDlg materials({1, 2}, lookup);
+    CEditScope edit(doc, "model");
+    ASSERT_TRUE(edit.Put(1, s) && edit.Put(1, concrete) && edit.Put(1, T_ELEM_D{1, 1, 2, 1, 1}) &&
+                edit.Put(2, T_ELEM_D{2, 1, 2, 0, 0}) && edit.Commit());
+    const CYieldStrengthCalcOptMatDescDlg materials(doc, {1, 2});
     ASSERT_EQ(2u, materials.Rows().size());
     EXPECT_EQ(25, materials.Rows()[0].fck);
     EXPECT_EQ(450, materials.Rows()[0].fyk);
     EXPECT_FALSE(materials.Rows()[0].Fy.has_value());
     EXPECT_STREQ("IDS_CMD_IEHP_NO_MATL", materials.Rows()[1].faultKey);
-    const CYieldStrengthCalcOptEffDescDlg sections({1, 2}, lookup);
+    const CYieldStrengthCalcOptEffDescDlg sections(doc, {1, 2});
     EXPECT_EQ(2, sections.Rows()[0].effective.I.Iyy);
     EXPECT_EQ(1, sections.Rows()[0].effective.J.Iyy);
     EXPECT_STREQ("IDS_CMD_IEHP_NO_SECT", sections.Rows()[1].faultKey);
