@@ -35,7 +35,6 @@ public:
     /// Copies go beside this file from now on; numbers go on after those that are there. The
     /// copies of the file before stay as they are.
     void Follow(const std::string& file);
-    const std::string& File() const { return m_file; }
 
     /// Writes a copy where the document has unsaved changes that the latest copy lacks, at most
     /// every 20 s and so that writing takes a twentieth of the time at most. nowS: a clock that

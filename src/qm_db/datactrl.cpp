@@ -13,13 +13,6 @@ void CDataCtrl::Assign(T_MODEL_CONTENT content)
     ++m_revision;
 }
 
-void CDataCtrl::SetResult(int pushover, std::shared_ptr<IPushResult> result)
-{
-    m_content.results[pushover] = std::move(result);
-    m_modified = true;
-    ++m_revision;
-}
-
 void CDataCtrl::SetStaticResult(int loadCase, std::shared_ptr<IStaticResult> result)
 {
     if (result)

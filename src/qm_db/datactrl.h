@@ -15,10 +15,8 @@ public:
 
     /// Replaces the whole content; the document counts as unmodified.
     void Assign(T_MODEL_CONTENT content);
-    /// Replaces or adds the results of one pushover load case.
-    void SetResult(int pushover, std::shared_ptr<IPushResult> result);
 
-    /// The same for a static load case; null removes them.
+    /// Replaces or adds the results of one static load case; null removes them.
     void SetStaticResult(int loadCase, std::shared_ptr<IStaticResult> result);
 
     /// Results of the construction stages; null where there are none.

@@ -5,6 +5,7 @@
 
 #include <algorithm>
 #include <exception>
+#include <vector>
 
 namespace {
 
@@ -19,7 +20,6 @@ int CRps_UnknownLoadFactorManager::Calc_UnknownLoadFactor(int mode, int ncon, in
                                                           std::span<const double> weights, int iobj,
                                                           int isign, int& error)
 {
-    *this = {};
     std::fill(factors.begin(), factors.end(), 0.0);
     error = ULF_BAD_INPUT;
     const bool isExact = mode == EQUATIONS;
@@ -33,16 +33,12 @@ int CRps_UnknownLoadFactorManager::Calc_UnknownLoadFactor(int mode, int ncon, in
         if (isExact) {
             T_ULF_EXACT exact;
             if (!SolveUlfExact(problem, exact)) return 1;
-            m_unmet = std::move(exact.unmet);
             x = std::move(exact.x);
-            error = m_unmet.empty() ? ULF_SOLVED : ULF_EQUALITIES_CONTRADICT;
+            error = exact.unmet.empty() ? ULF_SOLVED : ULF_EQUALITIES_CONTRADICT;
         } else {
             T_ULF_ANSWER answer = SolveUlf(problem);
             x = std::move(answer.x);
             error = answer.code;
-            m_violation = answer.certificate.violation;
-            m_steps = answer.steps;
-            m_isFallback = answer.isFallback;
         }
         std::copy(x.begin(), x.end(), factors.begin());
     } catch (const std::exception&) { // out of memory

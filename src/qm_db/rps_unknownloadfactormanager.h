@@ -2,7 +2,6 @@
 #pragma once
 
 #include <span>
-#include <vector>
 
 /// Finds the factors that meet the constraints, by optimisation or from simultaneous equations.
 /// Method: dual active-set method of Goldfarb and Idnani (1983) on rows scaled to unit length;
@@ -10,7 +9,7 @@
 /// computed from the original rows, else by the simplex method (Clp); equations by QR with column
 /// pivoting. Tolerances, zero weights and the codes: ulfproblem.h.
 /// Units: those of the caller; rows and unknowns may differ in unit.
-/// State: the figures of the last call.
+/// State: none.
 class CRps_UnknownLoadFactorManager {
 public:
     /// mode 1: smallest objective subject to the first neq rows * x = rhs and the others
@@ -18,8 +17,7 @@ public:
     /// factor negative; -1: none positive; 0: free. Where the optimum is not unique the answer is
     /// the one with the smallest sum of (w x)^2, whatever the order of the rows.
     /// mode 0: all rows are equations; neq, iobj and isign do not matter. Singular and consistent:
-    /// the smallest sum of (w x)^2. Contradictory: least squares, code 5, and UnmetRows says which
-    /// rows are not met.
+    /// the smallest sum of (w x)^2. Contradictory: least squares, code 5.
     /// coefficients: ncon x nvar, row after row; rhs: ncon; factors and weights: nvar.
     /// Returns 1 when `error` is the answer: 0 and 9 with factors, -1 and 4 to 8 without (zeros;
     /// the least-squares factors for code 5 of mode 0). Returns 0, error 10 and zeros, when no
@@ -29,17 +27,4 @@ public:
                                              std::span<const double> rhs, std::span<double> factors,
                                              std::span<const double> weights, int iobj, int isign,
                                              int& error);
-
-    /// Mode 0: rows, counted from 0, that the factors miss by more than 1e-6 (relative).
-    const std::vector<int>& UnmetRows() const { return m_unmet; }
-    /// Largest violation of a row by the factors of mode 1, relative in the scale of ulfproblem.h.
-    double Violation() const { return m_violation; }
-    int Steps() const { return m_steps; }            // of the active-set method
-    bool IsFallback() const { return m_isFallback; } // the simplex method gave the answer
-
-private:
-    std::vector<int> m_unmet;
-    double m_violation = 0.0;
-    int m_steps = 0;
-    bool m_isFallback = false;
 };

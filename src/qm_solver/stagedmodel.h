@@ -28,7 +28,7 @@ struct T_STAGE {
     std::vector<T_STAGE_SUPPORT> activateSupports, deactivateSupports;
     std::vector<T_STAGE_LOAD> activateLoads, deactivateLoads;
     int steps = 1;
-    double duration = 0.0; // in the user's unit of time; gives the elements' ages, nothing else
+    double duration = 0.0; // in the user's unit of time; no result depends on it
 };
 
 enum class LOAD_GROUP { Dead, Erection, Rest };

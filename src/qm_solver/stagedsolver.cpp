@@ -109,19 +109,6 @@ int CStagedSolver::StepCount(std::size_t stage) const
     return stage < StageCount() ? m_state->prepared->model.stages[stage].steps : 0;
 }
 
-double CStagedSolver::Age(std::size_t element, std::size_t stage) const
-{
-    constexpr double kAway = -1.0;
-    if (stage >= StageCount() || element >= m_state->prepared->plan.bornIn.size()) return kAway;
-    const auto& there = m_state->prepared->plan.active[stage].elements;
-    if (!std::binary_search(there.begin(), there.end(), element)) return kAway;
-    double age = 0.0;
-    for (auto s = static_cast<std::size_t>(m_state->prepared->plan.bornIn[element]); s <= stage;
-         ++s)
-        age += m_state->prepared->model.stages[s].duration;
-    return age;
-}
-
 const T_STAGED_COST& CStagedSolver::Cost() const
 {
     static const T_STAGED_COST kNothing;

@@ -63,9 +63,6 @@ public:
 
     std::size_t StageCount() const;
     int StepCount(std::size_t stage) const;
-    /// Time from the beginning of an element's first stage to the end of this one; negative if it
-    /// is not there.
-    double Age(std::size_t element, std::size_t stage) const;
     const T_STAGED_COST& Cost() const;
 
     /// Results at the end of a step: the sum of factor times load case, one factor per case. What

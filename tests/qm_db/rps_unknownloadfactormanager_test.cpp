@@ -1,4 +1,4 @@
-// Problems with answers known by hand or from publications, and input that is refused.
+// Problems with answers known by hand, and input that is refused.
 #include "numbers.h"
 
 #include "qm_db/rps_unknownloadfactormanager.h"
@@ -28,22 +28,17 @@ const T_CASE kByHand[] = {
     {"square by weight",      1, {1, 1},       {2},    {1, 2}, 2, 0, 0, {1.6, 0.4}},
     {"sum takes the cheap one", 1, {1, 1},     {2},    {1, 2}, 1, 0, 0, {2, 0}},
     {"sum, tie: shortest",    1, {1, 1},       {2},    {1, 1}, 1, 0, 0, {1, 1}},
-    {"sum, negative side",    1, {1, -1},      {-2},   {2, 1}, 1, 0, 0, {0, 2}},
     {"largest levels out",    1, {1, 1},       {2},    {1, 2}, 3, 0, 0, {4.0 / 3, 2.0 / 3}},
-    {"largest, tie: shortest", 1, {1, 0},      {1},    {1, 1}, 3, 0, 0, {1, 0}},
     {"inequality pulls",      1, {1, 1, -1, 0}, {1, -3}, {1, 1}, 2, 0, 0, {3, -2}},
     {"sum over an inequality", 0, {-1, -2},    {-4},   {1, 1}, 1, 0, 0, {0, 2}},
     {"all negative",          1, {1, 1},       {-2},   {1, 1}, 2, -1, 0, {-1, -1}},
-    {"sum, all negative",     1, {1, 3},       {-6},   {1, 1}, 1, -1, 0, {0, -2}},
     {"sign decides",          1, {1, -1, -1, 0}, {1, -1}, {1, 1}, 2, 1, 0, {1, 0}},
     {"loose bound of 1e30",   1, {1, 0, 1, 1}, {3, 1e30}, {1, 1}, 2, 0, 0, {3, 0}},
     {"rows that say nothing", 1, {0, 0, 0, 0}, {0, 1}, {1, 1}, 2, 0, 0, {0, 0}},
     {"repeated equality",     2, {1, 1, 2, 2}, {2, 4}, {1, 1}, 3, 1, 0, {1, 1}},
     {"equality by inequalities", 0, {1, 1, -1, -1}, {2, -2}, {1, 1}, 1, 0, 0, {1, 1}},
     {"free unknown, square",  1, {1, 1},       {2},    {1, 0}, 2, 0, 0, kAlmostFree},
-    {"free unknown, sum",     1, {1, 1},       {2},    {1, 0}, 1, 0, 0, {0, 2}},
     {"free unknown, largest", 1, {1, 1},       {2},    {1, 0}, 3, 0, 0, {0, 2}},
-    {"all unknowns free",     1, {1, 1},       {2},    {0, 0}, 1, 0, 0, {1, 1}},
     {"no rows",               0, {},           {},     {1, 1}, 1, 0, 0, {0, 0}},
     {"overflowing unit mix",  1, {1e200, 1e-200}, {1e200}, {1e-150, 1e150}, 2, 0, 0, {1, 0}},
     {"equalities contradict", 2, {1, 1, 1, 1}, {1, 2}, {1, 1}, 2, 0, 5, {}},
@@ -52,18 +47,14 @@ const T_CASE kByHand[] = {
     {"bounds cross",          0, {1, 0, -1, 0}, {1, -2}, {1, 1}, 1, 0, 6, {}},
     {"equality against bound", 1, {1, 1, 1, 1}, {2, 1}, {1, 1}, 3, 0, 6, {}},
     {"other sign only",       1, {1, 1},       {-2},   {1, 1}, 2, 1, 7, {}},
-    {"other sign only, sum",  1, {1, 1},       {2},    {1, 1}, 1, -1, 7, {}},
     {"met within 1e-9",       2, {1, 1, 1, 1}, {1, 1 + 2e-9}, {1, 1}, 2, 0, 9, {0.5, 0.5}},
     {"objective 0",           1, {1, 1},       {2},    {1, 1}, 0, 0, -1, {}},
-    {"objective 4",           1, {1, 1},       {2},    {1, 1}, 4, 0, -1, {}},
     {"NaN in a row",          1, {1, kNan},    {2},    {1, 1}, 2, 0, 4, {}},
-    {"NaN before the objective", 1, {1, kNan}, {2},    {1, 1}, 9, 0, 4, {}},
     {"infinite right-hand side", 0, {1, 1},    {kInf}, {1, 1}, 2, 0, 4, {}},
     {"NaN weight",            1, {1, 1},       {2},    {1, kNan}, 2, 0, 4, {}},
     {"negative weight",       1, {1, 1},       {2},    {1, -1}, 2, 0, 4, {}},
     {"sign 2",                1, {1, 1},       {2},    {1, 1}, 2, 2, 4, {}},
     {"more equalities than rows", 2, {1, 1},   {2},    {1, 1}, 2, 0, 4, {}},
-    {"negative count",        -1, {1, 1},      {2},    {1, 1}, 2, 0, 4, {}},
     {"matrix too short",      1, {1},          {2},    {1, 1}, 2, 0, 4, {}},
     {"no unknowns",           0, {},           {},     {},     2, 0, 4, {}},
 };
@@ -82,55 +73,26 @@ T_VECTOR Solve(CRps_UnknownLoadFactorManager& manager, int mode, const T_CASE& c
 
 struct T_SYSTEM {
     const char* label;
-    int n;
+    int n, error;
     T_VECTOR rows, rhs, weights, x;
-    std::vector<int> unmet;
 };
 
 // clang-format off
 const T_SYSTEM kSystems[] = {
-    {"regular",             2, {2, 1, 1, 3},          {5, 10},    {1, 1}, {1, 3},     {}},
-    {"mixed units",         2, {2e9, 1e-9, 1e9, 3e-9}, {5e0, 1e1}, {1, 1}, {1e-9, 3e9}, {}},
-    {"weights do not matter", 2, {2, 1, 1, 3},        {5, 10},    {1e-6, 0}, {1, 3},  {}},
-    {"singular: shortest",  2, {1, 1, 2, 2},          {2, 4},     {1, 1}, {1, 1},     {}},
-    {"singular, by weight", 2, {1, 1, 2, 2},          {2, 4},     {1, 2}, {1.6, 0.4}, {}},
-    {"singular, scaled rows", 2, {1e-9, 1e-9, 2e6, 2e6}, {2e-9, 4e6}, {1, 1}, {1, 1}, {}},
-    {"all zero",            2, {0, 0, 0, 0},          {0, 0},     {1, 1}, {0, 0},     {}},
-    {"contradictory: between", 2, {1, 0, 1, 0},       {1, 2},     {1, 1}, {1.5, 0},   {0, 1}},
-    {"rows weigh alike",    2, {1, 0, 1e6, 0},        {1, 2e6},   {1, 1}, {1.5, 0},   {0, 1}},
-    {"zero row, not zero",  2, {1, 1, 0, 0},          {2, 3},     {1, 1}, {1, 1},     {1}},
-    {"one row is met",      3, {1,0,0, 1,0,0, 0,0,1}, {1, 3, 5},  {1, 1, 1}, {2, 0, 5}, {0, 1}},
-    {"met to 1e-7 is met",  2, {1, 0, 1, 0},          {1, 1 + 2e-7}, {1, 1}, {1 + 1e-7, 0}, {}},
-    {"large beside small",  3, {1,0,0, 1,0,0, 0,0,1}, {1, 1.0001, 1e7}, {1, 1, 1},
-     {1.00005, 0, 1e7}, {0, 1}},
-};
-// clang-format on
-
-/// Beam of equal spans under uniform load: influence of unit props on the displacements or moments
-/// above them. Exact fractions by the simple-beam formulas; the support moments are those of the
-/// three-moment equations (2/19 and 3/38 of w L^2 for five spans, 3/28 and 1/14 for four).
-struct T_PROPS {
-    const char* label;
-    T_VECTOR rows, rhs, factors;
-};
-
-// clang-format off
-const T_PROPS kProps[] = {
-    { "four spans, displacements",
-      { 3.0/4, 11.0/12, 7.0/12,  11.0/12, 4.0/3, 11.0/12,  7.0/12, 11.0/12, 3.0/4 },
-      { 19.0/8, 10.0/3, 19.0/8 }, { 8.0/7, 13.0/14, 8.0/7 } },
-    { "four spans, moments",
-      { 3.0/4, 1.0/2, 1.0/4,  1.0/2, 1.0, 1.0/2,  1.0/4, 1.0/2, 3.0/4 },
-      { 3.0/2 + 3.0/28, 2.0 + 1.0/14, 3.0/2 + 3.0/28 }, { 8.0/7, 13.0/14, 8.0/7 } },
-    { "five spans, displacements",
-      { 16.0/15, 3.0/2, 4.0/3, 23.0/30,  3.0/2, 12.0/5, 34.0/15, 4.0/3,
-        4.0/3, 34.0/15, 12.0/5, 3.0/2,  23.0/30, 4.0/3, 3.0/2, 16.0/15 },
-      { 29.0/6, 31.0/4, 31.0/4, 29.0/6 }, { 43.0/38, 37.0/38, 37.0/38, 43.0/38 } },
-    { "five spans, moments",
-      { 4.0/5, 3.0/5, 2.0/5, 1.0/5,  3.0/5, 6.0/5, 4.0/5, 2.0/5,
-        2.0/5, 4.0/5, 6.0/5, 3.0/5,  1.0/5, 2.0/5, 3.0/5, 4.0/5 },
-      { 2.0 + 2.0/19, 3.0 + 3.0/38, 3.0 + 3.0/38, 2.0 + 2.0/19 },
-      { 43.0/38, 37.0/38, 37.0/38, 43.0/38 } },
+    {"regular",                2, 0, {2, 1, 1, 3},          {5, 10},    {1, 1}, {1, 3}},
+    {"mixed units",            2, 0, {2e9, 1e-9, 1e9, 3e-9}, {5e0, 1e1}, {1, 1}, {1e-9, 3e9}},
+    {"weights do not matter",  2, 0, {2, 1, 1, 3},          {5, 10},    {1e-6, 0}, {1, 3}},
+    {"singular: shortest",     2, 0, {1, 1, 2, 2},          {2, 4},     {1, 1}, {1, 1}},
+    {"singular, by weight",    2, 0, {1, 1, 2, 2},          {2, 4},     {1, 2}, {1.6, 0.4}},
+    {"singular, scaled rows",  2, 0, {1e-9, 1e-9, 2e6, 2e6}, {2e-9, 4e6}, {1, 1}, {1, 1}},
+    {"all zero",               2, 0, {0, 0, 0, 0},          {0, 0},     {1, 1}, {0, 0}},
+    {"contradictory: between", 2, 5, {1, 0, 1, 0},          {1, 2},     {1, 1}, {1.5, 0}},
+    {"rows weigh alike",       2, 5, {1, 0, 1e6, 0},        {1, 2e6},   {1, 1}, {1.5, 0}},
+    {"zero row, not zero",     2, 5, {1, 1, 0, 0},          {2, 3},     {1, 1}, {1, 1}},
+    {"met to 1e-7 is met",     2, 0, {1, 0, 1, 0},          {1, 1 + 2e-7}, {1, 1}, {1 + 1e-7, 0}},
+    {"large beside small",     3, 5, {1,0,0, 1,0,0, 0,0,1}, {1, 1.0001, 1e7}, {1, 1, 1},
+     {1.00005, 0, 1e7}},
+    {"not a number",           2, 4, {1, kNan, 1, 0},       {1, 2},     {1, 1}, {0, 0}},
 };
 // clang-format on
 
@@ -167,50 +129,9 @@ TEST(UnknownLoadFactor, EquationsGiveTheirSolutionTheShortestOrTheLeastSquares)
         EXPECT_EQ(1, manager.Calc_UnknownLoadFactor(0, static_cast<int>(s.rhs.size()), s.n, 0,
                                                     s.rows, s.rhs, x, s.weights, 2, 0, error))
             << s.label;
-        EXPECT_EQ(s.unmet.empty() ? 0 : 5, error) << s.label;
-        EXPECT_EQ(s.unmet, manager.UnmetRows()) << s.label;
+        EXPECT_EQ(s.error, error) << s.label;
         for (std::size_t j = 0; j < x.size(); ++j)
             EXPECT_NEAR(s.x[j], x[j], 1e-14 * (std::fabs(s.x[j]) + (s.x[j] > 0.0 ? 0.0 : 10.0)))
                 << s.label;
-    }
-}
-
-TEST(UnknownLoadFactor, EquationsRefuseNotANumberAndForgetTheLastCall)
-{
-    CRps_UnknownLoadFactorManager manager;
-    int error = 77;
-    T_VECTOR x(2, 7.0);
-    const T_VECTOR rows{1, 0, 1, 0}, bad{1, kNan, 1, 0}, rhs{1, 2}, w{1, 1};
-    EXPECT_EQ(1, manager.Calc_UnknownLoadFactor(0, 2, 2, 2, rows, rhs, x, w, 2, 0, error));
-    EXPECT_EQ(5, error);
-    EXPECT_EQ(1, manager.Calc_UnknownLoadFactor(0, 2, 2, 2, bad, rhs, x, w, 2, 0, error));
-    EXPECT_EQ(4, error);
-    EXPECT_EQ(T_VECTOR(2, 0.0), x);
-    EXPECT_TRUE(manager.UnmetRows().empty());
-}
-
-TEST(UnknownLoadFactor, PropsOfAContinuousBeamAreThePublishedReactions)
-{
-    for (const T_PROPS& p : kProps) {
-        const int n = static_cast<int>(p.rhs.size());
-        const T_VECTOR weights(p.rhs.size(), 1.0);
-        for (const int mode : {0, 1})
-            for (const int iobj : {1, 2, 3})
-                for (const int isign : {0, 1}) {
-                    CRps_UnknownLoadFactorManager manager;
-                    int error = 77;
-                    T_VECTOR x(weights.size());
-                    EXPECT_EQ(1, manager.Calc_UnknownLoadFactor(mode, n, n, n, p.rows, p.rhs, x,
-                                                                weights, iobj, isign, error));
-                    EXPECT_EQ(0, error) << p.label;
-                    for (std::size_t j = 0; j < x.size(); ++j)
-                        EXPECT_NEAR(p.factors[j], x[j], 2e-14) << p.label << " mode " << mode;
-                }
-        CRps_UnknownLoadFactorManager manager;
-        int error = 77;
-        T_VECTOR x(weights.size());
-        EXPECT_EQ(
-            1, manager.Calc_UnknownLoadFactor(1, n, n, n, p.rows, p.rhs, x, weights, 2, -1, error));
-        EXPECT_EQ(7, error) << "props push upwards only";
     }
 }

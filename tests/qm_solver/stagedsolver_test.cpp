@@ -85,17 +85,6 @@ TEST(StagedSolver, SegmentsBornToDesignDeflectAsIfBuiltAtOnce)
     }
 }
 
-TEST(StagedSolver, AgesCountFromTheStageOfBirth)
-{
-    T_STAGED_MODEL model = Balanced();
-    for (T_STAGE& stage : model.stages)
-        stage.duration = 7.0;
-    CStagedSolver staged;
-    Build(staged, model, {Weight()});
-    EXPECT_EQ(21.0, staged.Age(4, 4));
-    EXPECT_GT(0.0, staged.Age(4, 1));
-}
-
 // ---- supports, elements and loads that come and go ----------------------------------------------
 
 /// Cantilever of two beams of 4, clamped at node 0.
@@ -150,71 +139,6 @@ TEST(StagedSolver, ASettlementLeavesWithItsSupportAndIsHeldByTheNext)
     for (std::size_t s = 0; s < 4; ++s)
         EXPECT_NEAR(tip[s], Case(staged, s, 0).displacement[2][2], 1e-14) << s;
     EXPECT_NEAR(0.01 * 3 * kEI / 512, Case(staged, 3, 0).reaction[2][2], 1e-9);
-}
-
-TEST(StagedSolver, SpringsAndLinksAreBornUnstressed)
-{
-    const double k = 150.0, bending = 3 * kEI / 512;
-    for (const bool link : {false, true}) {
-        T_FRAME frame = Cantilever();
-        const std::size_t ground = AddNode(frame, {8, 0, -1});
-        FixAll(frame, ground);
-        const T_VEC6 stiffness{0, 0, k, 0, 0, 0};
-        if (link)
-            Join(frame, ELEMENT_KIND::Link, ground, 2, stiffness);
-        else
-            Join(frame, ELEMENT_KIND::Spring, 2, 0, stiffness);
-        T_STAGED_MODEL model = OneStage(frame, 2);
-        model.stages[0].activateElements = {0, 1};
-        model.stages[0].activateLoads = {{0, kFirstStep}};
-        T_STAGE born;
-        born.activateElements = {2};
-        born.activateLoads = {{1, kFirstStep}};
-        model.stages.push_back(born);
-        CStagedSolver staged;
-        Build(staged, model, {At(2, {0, 0, -10, 0, 0, 0}), At(2, {0, 0, -8, 0, 0, 0})});
-        const std::size_t held = link ? ground : 2;
-        EXPECT_NEAR(-10 / bending, Case(staged, 1, 0).displacement[2][2], 1e-12) << link;
-        EXPECT_NEAR(0, Case(staged, 1, 0).reaction[held][2], 1e-10) << link;
-        EXPECT_NEAR(-8 / (bending + k), Case(staged, 1, 1).displacement[2][2], 1e-12) << link;
-        EXPECT_NEAR(8 * k / (bending + k), Case(staged, 1, 1).reaction[held][2], 1e-10) << link;
-    }
-}
-
-TEST(StagedSolver, ATieKeepsTheDifferenceThatItFinds)
-{
-    // Two columns of the same height tied along X; the second comes when the first has moved.
-    for (const bool diaphragm : {false, true}) {
-        T_FRAME frame = Empty();
-        frame.sections[0].Iz = kIy;
-        for (const T_VEC3 at : {T_VEC3{0, 0, 0}, {0, 0, 4}, {6, 0, 0}, {6, 0, 4}})
-            AddNode(frame, at);
-        FixAll(frame, 0);
-        FixAll(frame, 2);
-        Join(frame, kBeam, 0, 1);
-        Join(frame, kBeam, 2, 3);
-        if (diaphragm)
-            frame.diaphragms.push_back({{3, 1}, 2}); // its first node comes last
-        else
-            frame.equalDisplacements.push_back({{3, 1}, {true, false, false, false, false, false}});
-        T_STAGED_MODEL model = OneStage(frame, 2);
-        model.stages[0].activateElements = {0};
-        model.stages[0].activateLoads = {{0, kFirstStep}};
-        T_STAGE second;
-        second.activateElements = {1};
-        second.activateLoads = {{1, kFirstStep}};
-        model.stages.push_back(second);
-        CStagedSolver staged;
-        Build(staged, model, {At(1, {10, 0, 0, 0, 0, 0}), At(1, {4, 0, 0, 0, 0, 0})});
-        const double flexibility = 64 / (3 * kEI);
-        const T_RESULT first = Case(staged, 1, 0), more = Case(staged, 1, 1);
-        EXPECT_NEAR(10 * flexibility, first.displacement[1][0], 1e-12) << diaphragm;
-        EXPECT_NEAR(0, first.displacement[3][0], 1e-14) << diaphragm;
-        EXPECT_NEAR(0, first.reaction[2][0], 1e-9) << diaphragm;
-        EXPECT_NEAR(2 * flexibility, more.displacement[1][0], 1e-12) << diaphragm;
-        EXPECT_NEAR(2 * flexibility, more.displacement[3][0], 1e-12) << diaphragm;
-        EXPECT_NEAR(-2, more.reaction[2][0], 1e-9) << diaphragm;
-    }
 }
 
 TEST(StagedSolver, TakingAnElementAwayReleasesItsForces)
@@ -314,23 +238,6 @@ TEST(StagedSolver, RunsAgainWithoutAnotherAnalysis)
     EXPECT_EQ(0U, other.Cost().analyses);
     ExpectSame(once, Case(other, kSegments, 0), 1e-12);
     ExpectSame(Sum(once, once), Case(staged, kSegments, 0), 1e-12); // stays
-}
-
-TEST(StagedSolver, StopsWhenItIsCancelled)
-{
-    CStagedSolver staged;
-    T_SOLVER_ERROR error;
-    ASSERT_TRUE(staged.Prepare(Balanced(), error));
-    std::vector<std::size_t> steps;
-    EXPECT_FALSE(staged.Run(std::vector<T_LOAD_CASE>{Weight()}, error,
-                            [&](std::size_t done, std::size_t total) {
-                                steps.push_back(done);
-                                return total == kSegments && done < 3;
-                            }));
-    EXPECT_EQ(SOLVER_FAULT::Cancelled, error.fault);
-    EXPECT_EQ((std::vector<std::size_t>{1, 2, 3}), steps);
-    T_RESULT r;
-    EXPECT_FALSE(staged.ReadCase(0, 1, 0, r));
 }
 
 } // namespace

@@ -34,7 +34,7 @@ struct T_STAG_D {
     std::string name;
     T_STAG_PART activate, deactivate;
     int steps = 1;
-    double duration = 0.0; // gives the elements' ages, nothing else; no unit is attached
+    double duration = 0.0; // no result depends on it, and no unit is attached
     bool operator==(const T_STAG_D&) const = default;
 };
 

@@ -28,8 +28,6 @@ public:
     /// Of a checked frame.
     CBeamElement(const T_FRAME& frame, const T_ELEMENT& element, double tension = 0.0);
 
-    double Length() const { return m_shape.length; }
-    const T_AXES& Axes() const { return m_axes; }
     /// A local displacement (0 to 11) that moves freely inside the element because of its
     /// releases (a beam released at both ends in torsion turns about its axis), or that its
     /// compression makes unstable; -1 none.

@@ -35,7 +35,6 @@ public:
     /// Multipliers u of the active rows with cost + sum of u * normal = 0 in the least squares
     /// sense; `cost` follows the side on which each elastic row now is.
     std::vector<long double> MultipliersOf(std::span<const double> cost, double capFactor) const;
-    const std::vector<std::size_t>& Active() const { return m_active; }
     int Steps() const { return m_steps; }
     /// After Infeasible: rows and factors whose sum contradicts itself (Farkas): normals add up to
     /// zero, right-hand sides to less than zero.

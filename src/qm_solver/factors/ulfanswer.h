@@ -11,9 +11,7 @@ struct T_ULF_ANSWER {
     std::vector<std::size_t> proof;       // codes 5 to 7: rows that together have no solution
     bool proofNeedsSign = false;          // ... and the sign restriction with them
     T_ULF_CERTIFICATE certificate;
-    int steps = 0;           // of the active-set method
-    double quadratic = 0.0;  // objectives 1 and 3: the quadratic term that was small enough
-    bool isFallback = false; // the linear programming library found it
+    double quadratic = 0.0; // objectives 1 and 3: the quadratic term that was small enough
 };
 
 /// Sets code 0 or 9 and keeps x when its certificate holds, 10 and no x otherwise.

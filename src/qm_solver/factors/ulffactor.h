@@ -20,7 +20,6 @@ class CUlfFactor {
 public:
     explicit CUlfFactor(std::size_t nVar);
 
-    std::size_t Count() const { return m_count; } // active normals
     void Clear();
     /// d, r, z of orient * normal of a row.
     void Direct(const T_ULF_ROWS& rows, std::size_t row, double orient, T_ULF_DIRECTION& to) const;

@@ -67,7 +67,6 @@ void SolveOnFace(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& scaled,
         std::vector<long double> multipliers = prices.MultipliersOf(face.cost, 0.0);
         if (Release(linear, face, multipliers, held, heldTol)) continue;
         if (method.Solve(0, face.rows.Size()) != ULF_STEP::Done) return;
-        answer.steps += method.Steps();
         multipliers.resize(scaled.nCon);
         AcceptUlf(problem, scaled, method.Y().first(scaled.nVar), std::move(multipliers), answer);
         return;
@@ -79,7 +78,6 @@ void SolveOnFace(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& scaled,
 T_ULF_ANSWER SolveUlfFallback(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& scaled)
 {
     T_ULF_ANSWER answer;
-    answer.isFallback = true;
     const T_ULF_LINEAR linear = LinearUlf(problem.objective, scaled);
     T_ULF_VERTEX vertex;
     if (!SolveUlfVertex(linear, vertex)) {

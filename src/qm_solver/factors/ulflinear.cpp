@@ -64,7 +64,6 @@ T_ULF_ANSWER SolveUlfLinear(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& sc
         method.SetObjective(gradient, 1.0 / quadratic);
         if (method.Steps() == 0) method.Start(linear.start);
         const ULF_STEP step = method.Solve(0, linear.rows.Size());
-        answer.steps = method.Steps();
         if (step == ULF_STEP::Infeasible) {
             T_ULF_ANSWER why = SolveUlfSquare(problem, scaled);
             if (why.code != ULF_SOLVED && why.code != ULF_RELAXED) return why;

@@ -39,7 +39,6 @@ T_ULF_ANSWER SolveUlfSquare(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& sc
     for (std::size_t begin = 0; const auto& stage : stages) {
         const ULF_STEP step = method.Solve(begin, stage.end);
         begin = stage.end;
-        answer.steps = method.Steps();
         if (step == ULF_STEP::Done) continue;
         answer.code = step == ULF_STEP::Limit ? static_cast<int>(ULF_ITERATION_LIMIT) : stage.code;
         for (const auto& [row, factor] : method.Proof()) {

@@ -9,12 +9,6 @@ CStageRecords::CStageRecords(const T_STAGED_MODEL& model, const T_STAGE_PLAN& pl
 {
 }
 
-void CStageRecords::Clear()
-{
-    m_records.clear();
-    m_from.clear();
-}
-
 void CStageRecords::BeginStage()
 {
     m_from.push_back(m_records.size());

@@ -27,12 +27,9 @@ class CStageRecords {
 public:
     CStageRecords(const T_STAGED_MODEL& model, const T_STAGE_PLAN& plan);
 
-    /// Forgets the steps from here on; the first step of the stage is next.
-    void Clear();
+    /// The first step of the stage is next.
     void BeginStage();
     void Add(T_STEP_RECORD record) { m_records.push_back(std::move(record)); }
-    bool Empty() const { return m_records.empty(); }
-    const T_STEP_RECORD& Last() const { return m_records.back(); }
     /// Null if the run has not come there.
     const T_STEP_RECORD* Find(std::size_t stage, int step) const;
 
