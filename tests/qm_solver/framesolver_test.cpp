@@ -60,58 +60,6 @@ TEST(FrameSolver, LoadsOnATrussGoToItsNodesByTheLeverRule)
     EXPECT_NEAR(-3.0 - 5.0 * 3 / 4 - 5.0 * 5 / 6, r.reaction[0][0], 1e-12);
 }
 
-/// Four cantilever columns of 3 m at the corners of 6 m x 4 m, tops tied by a diaphragm to a free
-/// node at (cx, cy), which is first in the diaphragm. Section with Iy = Iz.
-T_FRAME Floor(double cx, double cy)
-{
-    T_FRAME frame = Empty();
-    frame.sections[0].Iy = frame.sections[0].Iz = 2e-5;
-    T_DIAPHRAGM floor;
-    floor.nodes.push_back(AddNode(frame, {cx, cy, 3}));
-    for (auto [x, y] : {std::pair{0.0, 0.0}, {6.0, 0.0}, {6.0, 4.0}, {0.0, 4.0}}) {
-        const std::size_t foot = AddNode(frame, {x, y, 0}), top = AddNode(frame, {x, y, 3});
-        FixAll(frame, foot);
-        Join(frame, ELEMENT_KIND::Beam, foot, top);
-        floor.nodes.push_back(top);
-    }
-    frame.diaphragms.push_back(floor);
-    return frame;
-}
-
-TEST(FrameSolver, TheMasterOfADiaphragmDoesNotMatter)
-{
-    T_FRAME frame = Floor(1, 5), turned = frame;
-    std::reverse(turned.diaphragms[0].nodes.begin(), turned.diaphragms[0].nodes.end());
-    turned.diaphragms.push_back({{2, 0, 8}, 2}); // overlapping, says nothing new
-    turned.equalDisplacements.push_back({{0, 4}, {false, false, false, false, false, true}});
-    T_LOAD_CASE load;
-    load.nodal.push_back({0, {5, -7, 0, 0, 0, 3}});
-    load.nodal.push_back({4, {1, 2, 3, 4, 5, 6}});
-    const T_RESULT a = Solved(frame, load), b = Solved(turned, load);
-    for (std::size_t n = 0; n < frame.nodes.size(); ++n)
-        for (std::size_t d = 0; d < 6; ++d) {
-            EXPECT_NEAR(a.displacement[n][d], b.displacement[n][d], 1e-13);
-            EXPECT_NEAR(a.reaction[n][d], b.reaction[n][d], 1e-10);
-        }
-}
-
-TEST(FrameSolver, ASupportedSlaveHandsItsForceToTheSupport)
-{
-    // Node 1 must move as node 0, which is fixed: the truss can't shorten.
-    T_FRAME frame = ThreeBars();
-    frame.equalDisplacements.push_back({{0, 1}, {true, false, true, false, false, false}});
-    Fix(frame, 0, {0, 2});
-    T_LOAD_CASE load, both;
-    load.settlement.push_back({0, {0, 0, 0.001, 0, 0, 0}});
-    load.settlement.push_back({1, {0, 0, 0.001, 0, 0, 0}});
-    load.nodal.push_back({0, {7, 0, 0, 0, 0, 0}});
-    const T_RESULT r = Solved(frame, load);
-    EXPECT_NEAR(0.0, r.force[0][0][0], 1e-12);
-    EXPECT_NEAR(-kEA * 0.001 / 4, r.force[1][0][0], 1e-9);
-    EXPECT_NEAR(-7.0, r.reaction[0][0] + r.reaction[1][0] + r.reaction[2][0] + r.reaction[3][0],
-                1e-10);
-}
-
 TEST(FrameSolver, ManyCasesAreWhatEachGivesAlone)
 {
     // More than one block of right-hand sides, each a multiple of the first.

@@ -64,15 +64,14 @@ TEST(Modes, OfASimpleBeamAreTheClosedFormWithTheErrorOfLumpedMass)
     }
 }
 
-/// Storeys of equal mass 2 and stiffness 500 in X (and Y if `both`), held at the foot.
-T_FRAME ShearBuilding(std::size_t storeys, bool both)
+/// Storeys of equal mass 2 and stiffness 500 in X, held at the foot.
+T_FRAME ShearBuilding(std::size_t storeys)
 {
     T_FRAME frame = Empty();
     for (std::size_t i = 0; i <= storeys; ++i) {
         AddNode(frame, {0, 0, 0}); // storeys in one place: a link does not feel the height
-        frame.nodes[i].mass = {2.0, both ? 2.0 : 0.0, 0.0};
-        if (i > 0)
-            Join(frame, ELEMENT_KIND::Link, i - 1, i, {500.0, both ? 500.0 : 0.0, 0, 0, 0, 0});
+        frame.nodes[i].mass = {2.0, 0.0, 0.0};
+        if (i > 0) Join(frame, ELEMENT_KIND::Link, i - 1, i, {500.0, 0, 0, 0, 0, 0});
     }
     Fix(frame, 0, {X, Y, Z, RX, RY, RZ});
     return frame;
@@ -88,7 +87,7 @@ TEST(Modes, OfAShearBuildingAreTheClosedForm)
 {
     for (std::size_t storeys : {1u, 2u, 9u, 2500u}) { // the last one by iteration
         const std::size_t count = std::min<std::size_t>(storeys, 12);
-        const std::vector<T_MODE> modes = Modes(ShearBuilding(storeys, false), count);
+        const std::vector<T_MODE> modes = Modes(ShearBuilding(storeys), count);
         ASSERT_EQ(count, modes.size());
         double percent = 0.0;
         for (std::size_t i = 0; i < count; ++i) {
@@ -104,25 +103,10 @@ TEST(Modes, OfAShearBuildingAreTheClosedForm)
     // Two storeys: the ratio of the storeys is the golden section g, L = m (1 + g) of the shape
     // (1, g), modal mass m (1 + g^2).
     const double g = (1.0 + std::sqrt(5.0)) / 2.0;
-    const T_MODE first = Modes(ShearBuilding(2, false), 1)[0];
+    const T_MODE first = Modes(ShearBuilding(2), 1)[0];
     EXPECT_NEAR(g, first.shape[2][X] / first.shape[1][X], 1e-12);
     EXPECT_NEAR(std::sqrt(2.0) * (1.0 + g) / std::sqrt(1.0 + g * g), first.participation[X], 1e-12);
     EXPECT_NEAR(50.0 * (1.0 + g) * (1.0 + g) / (1.0 + g * g), first.massPercent[X], 1e-10);
-}
-
-TEST(Modes, OfADoublySymmetricBuildingComeInPairsAlongItsAxes)
-{
-    for (std::size_t storeys : {20u, 400u}) { // dense, and by iteration
-        const std::vector<T_MODE> modes = Modes(ShearBuilding(storeys, true), 7); // cuts a pair
-        ASSERT_EQ(7u, modes.size());
-        for (std::size_t i = 0; i < 7; ++i) {
-            const double expected = ShearOmega2(storeys, i / 2 + 1);
-            EXPECT_NEAR(expected, modes[i].omega2, 1e-8 * expected) << storeys << " " << i;
-            if (i == 6) continue; // its partner was not asked for
-            EXPECT_NEAR(0.0, modes[i].massPercent[i % 2 ? X : Y], 1e-9);
-            EXPECT_GT(modes[i].massPercent[i % 2 ? Y : X], 0.1);
-        }
-    }
 }
 
 /// A slab on four corner springs of 100 at (+-4, +-4) about (10, 20); four masses of 3 at half of
@@ -168,53 +152,6 @@ TEST(Modes, OfARigidSlabSwayAndTurn)
     EXPECT_EQ(2u, Modes(Slab(true), 10).size()); // turning has no mass
 }
 
-TEST(Modes, SumUpToTheWholeMassAndAreOrthonormal)
-{
-    const T_FRAME frame = IrregularTower(4);
-    const std::vector<T_MODE> modes = Modes(frame, 1000);
-    ASSERT_EQ(48u, modes.size()); // 16 nodes, three directions
-    for (std::size_t d = 0; d < 6; ++d) {
-        double percent = 0.0;
-        for (const T_MODE& mode : modes)
-            percent += mode.massPercent[d];
-        EXPECT_NEAR(100.0, percent, 1e-8) << d;
-    }
-    // Nodal masses and half of the masses of beams at a node: two floor beams and one or two
-    // columns, worked out from the coordinates here.
-    std::vector<double> beams(frame.nodes.size(), 0.0);
-    for (const T_ELEMENT& e : frame.elements) {
-        double length2 = 0.0;
-        for (std::size_t i = 0; i < 3; ++i)
-            length2 += std::pow(frame.nodes[e.j].xyz[i] - frame.nodes[e.i].xyz[i], 2);
-        for (std::size_t n : {e.i, e.j})
-            beams[n] += 7.85 * 5.4e-3 * std::sqrt(length2) / 2.0;
-    }
-    for (std::size_t a = 0; a < modes.size(); ++a)
-        for (std::size_t b = 0; b <= a; ++b) {
-            double product = 0.0;
-            for (std::size_t n = 0; n < frame.nodes.size(); ++n)
-                for (std::size_t i = 0; i < 3; ++i)
-                    product += modes[a].shape[n][i] * modes[b].shape[n][i] *
-                               (frame.nodes[n].mass[i] + beams[n]);
-            EXPECT_NEAR(a == b ? 1.0 : 0.0, product, 1e-9) << a << " " << b;
-        }
-    for (std::size_t i = 1; i < modes.size(); ++i)
-        EXPECT_LE(modes[i - 1].omega2, modes[i].omega2);
-}
-
-TEST(Modes, AreTheSameByIterationAndAllAtOnce)
-{
-    const T_FRAME frame = IrregularTower(35); // 420 masses
-    const std::vector<T_MODE> few = Modes(frame, 10), all = Modes(frame, 400);
-    ASSERT_EQ(10u, few.size());
-    for (std::size_t i = 0; i < few.size(); ++i) {
-        EXPECT_NEAR(all[i].omega2, few[i].omega2, 1e-8 * all[i].omega2);
-        for (std::size_t n = 0; n < frame.nodes.size(); ++n)
-            for (std::size_t d = 0; d < 6; ++d) // the sign is settled too
-                EXPECT_NEAR(all[i].shape[n][d], few[i].shape[n][d], 1e-6);
-    }
-}
-
 TEST(Modes, NeedMassThatCanMoveAndCanBeCancelled)
 {
     T_FRAME frame = Beam(4, {Z, RY}, {});
@@ -229,7 +166,7 @@ TEST(Modes, NeedMassThatCanMoveAndCanBeCancelled)
     ASSERT_EQ(1, solver.Prepare(frame, error));
     EXPECT_EQ(0, solver.Modes(1, modes, error));
     EXPECT_EQ(SOLVER_FAULT::NoMass, error.fault);
-    ASSERT_EQ(1, solver.Prepare(ShearBuilding(500, true), error));
+    ASSERT_EQ(1, solver.Prepare(ShearBuilding(1000), error));
     std::size_t calls = 0;
     const auto stop = [&](std::size_t done, std::size_t total) {
         EXPECT_LE(done, total);

@@ -10,7 +10,7 @@ namespace {
 
 using namespace sample;
 
-constexpr double kL = 4.0, kEIy = 7770.0, kEIz = 2730.0, kEA = 1.134e6, kGJ = 17.01;
+constexpr double kL = 4.0, kEIy = 7770.0, kEIz = 2730.0;
 constexpr double kTolerance = 1e-10; // relative to the largest value of the beam's end
 
 /// Where the beam lies: its direction and reference vector.
@@ -69,8 +69,6 @@ const T_ROW kRows[] = {
      {12, 9, 6, 3, 0}},
     {"cantilever, load up y: moment z", false, {}, {}, 0, 0, {0, kLine, true, 1, {3, 3}, {0, 1}}, 5,
      {24, 13.5, 6, 1.5, 0}},
-    {"cantilever, load up y: shear y", false, {}, {}, 0, 0, {0, kLine, true, 1, {3, 3}, {0, 1}}, 1,
-     {12, 9, 6, 3, 0}},
     {"cantilever, load along x", false, {}, {}, 0, 0, {0, kLine, true, 0, {2, 4}, {0, 0.5}}, 0,
      {6, 3.5, 0, 0, 0}},
     {"cantilever, twist at 3/4", false, {}, {}, 0, 0, {0, kMoment, true, 0, {5, 0}, {0.75, 1}}, 3,
@@ -79,22 +77,12 @@ const T_ROW kRows[] = {
      {0, kPoint, true, 2, {10, 0}, {1, 1}}, 2, {10, 10, 10, 10, 0}},
     {"two supports, own weight", true, {4, 5}, {4, 5}, 0, 0.7,
      {0, kLine, true, 2, {-3, -3}, {0, 1}}, 4, {0, -4.5, -6, -4.5, 0}},
-    {"two supports, shear z", true, {4, 5}, {4, 5}, 0, 0.7,
-     {0, kLine, true, 2, {-3, -3}, {0, 1}}, 2, {-6, -3, 0, 3, 6}},
     {"clamped, uniform y", true, {}, {}, 0, 0, {0, kLine, true, 1, {-3, -3}, {0, 1}}, 5,
      {-4, 0.5, 2, 0.5, -4}},
-    {"clamped, uniform y, shear deformation changes nothing", true, {}, {}, 0.8, 0,
-     {0, kLine, true, 1, {-3, -3}, {0, 1}}, 5, {-4, 0.5, 2, 0.5, -4}},
-    {"clamped, triangle z", true, {}, {}, 0, 0, {0, kLine, true, 2, {0, -6}, {0, 1}}, 4,
-     {3.2, -0.15, -2, -0.85, 4.8}},
-    {"clamped, force at 1/4", true, {}, {}, 0, 0, {0, kPoint, true, 1, {-16, 0}, {0.25, 1}}, 5,
-     {-9, 4.5, 2, -0.5, -3}},
     {"clamped, force at 1/4: cut just before it", true, {}, {}, 0, 0,
      {0, kPoint, true, 1, {-16, 0}, {0.25, 1}}, 1, {-13.5, -13.5, 2.5, 2.5, 2.5}},
     {"clamped, moment at 1/4", true, {}, {}, 0, 0, {0, kMoment, true, 2, {16, 0}, {0.25, 1}}, 5,
      {3, 7.5, -4, 0.5, 5}},
-    {"propped at J, uniform y", true, {}, {5}, 0, 0, {0, kLine, true, 1, {-8, -8}, {0, 1}}, 5,
-     {-16, 0, 8, 8, 0}},
     {"propped at J, uniform y, phi = 1", true, {}, {5}, 1, 0,
      {0, kLine, true, 1, {-8, -8}, {0, 1}}, 1, {-19.2, -11.2, -3.2, 4.8, 12.8}},
     {"propped at I, uniform z, phi = 1", true, {4}, {}, 0, 1,
@@ -129,39 +117,6 @@ TEST(BeamElement, InternalForcesAreThoseOfTheTables)
                     << "position " << p;
         }
 }
-
-TEST(BeamElement, TipDisplacesByTheClosedForms)
-{
-    const double P = 7.0, phi = 0.6;
-    for (const T_PLACE& place : kPlaces) {
-        SCOPED_TRACE(place.label);
-        const T_FRAME frame = OneBeam(place, false, phi, 0.0);
-        T_AXES axes;
-        // Local axes by their definition: z is the reference less its part along x.
-        T_VEC3 reference = place.zAxis;
-        if (Norm(reference) == 0.0)
-            reference = place.direction[2] == 1.0 ? T_VEC3{1, 0, 0} : T_VEC3{0, 0, 1};
-        axes[0] = place.direction;
-        axes[2] = Minus(reference, Scaled(axes[0], Dot(axes[0], reference)));
-        axes[2] = Scaled(axes[2], 1.0 / Norm(axes[2]));
-        axes[1] = Cross(axes[2], axes[0]);
-        const T_VEC3 force = ToGlobal(axes, {P, P, P}), moment = ToGlobal(axes, {P, 0, 0});
-        T_LOAD_CASE load;
-        load.nodal.push_back({1, {force[0], force[1], force[2], moment[0], moment[1], moment[2]}});
-        const T_VEC6 u = Solved(frame, load).displacement[1];
-        const T_VEC3 move = ToLocal(axes, Part(u, 0)), turn = ToLocal(axes, Part(u, 3));
-        const double L3 = kL * kL * kL;
-        // P L / GAs = P phi L^3 / 12 EI
-        const T_VEC3 moved{P * kL / kEA, P * L3 / kEIz * (1.0 / 3 + phi / 12), P * L3 / (3 * kEIy)};
-        const T_VEC3 turned{P * kL / kGJ, -P * kL * kL / (2 * kEIy), P * kL * kL / (2 * kEIz)};
-        for (std::size_t d = 0; d < 3; ++d) {
-            EXPECT_NEAR(moved[d], move[d], kTolerance * std::fabs(moved[1]));
-            EXPECT_NEAR(turned[d], turn[d], kTolerance * std::fabs(turned[0]));
-        }
-    }
-}
-
-// ---- any load, by the force method --------------------------------------------------------------
 
 /// Fixed-end forces in the plane x-y by brute force: the cantilever clamped at I and the two
 /// redundants at J, virtual work integrated by Simpson's rule over short steps.
@@ -233,30 +188,6 @@ TEST(BeamElement, AnyLoadOnAClampedBeamMatchesTheForceMethod)
             EXPECT_NEAR(expected.shearJ, z[2], 1e-8);
             EXPECT_NEAR(-expected.momentJ, z[4], 1e-8);
         }
-}
-
-// ---- offsets, releases --------------------------------------------------------------------------
-
-TEST(BeamElement, OffsetsCarryTheForcesOfTheEndsToTheNodes)
-{
-    // A cantilever whose flexible end sits beside both nodes: statics gives the reaction, the
-    // closed form the rigid-body part of the displacement of J.
-    T_FRAME frame = OneBeam(kPlaces[0], false, 0.0, 0.0);
-    frame.elements[0].offsetI = {0.5, 0.2, -0.3};
-    frame.elements[0].offsetJ = {-0.5, 0.2, -0.3};
-    T_LOAD_CASE load;
-    load.nodal.push_back({1, {0, 0, 6, 0, 0, 0}}); // at J, 0.5 beyond the flexible end
-    const T_RESULT r = Solved(frame, load);
-    const double l = kL - 1.0, P = 6.0, M = 6.0 * 0.5;
-    EXPECT_NEAR(-P, r.reaction[0][2], 1e-10);
-    EXPECT_NEAR(P * kL, r.reaction[0][4], 1e-10);
-    const double torque = P * -0.2; // the flexible axis lies 0.2 towards +y of the force
-    EXPECT_NEAR(torque, r.force[0][2][3], 1e-10);
-    EXPECT_NEAR(-(P * (l + 0.5)), r.force[0][0][4], 1e-10);
-    EXPECT_NEAR(-M, r.force[0][4][4], 1e-10);
-    const double slope = P * l * l / (2 * kEIy) + M * l / kEIy, twist = torque * l / kGJ;
-    const double end = P * l * l * l / (3 * kEIy) + M * l * l / (2 * kEIy);
-    EXPECT_NEAR(end + 0.5 * slope - 0.2 * twist, r.displacement[1][2], 1e-12);
 }
 
 TEST(BeamElement, WeightAndLoadsInGlobalDirectionsAreThoseOfTheFlexibleLength)

@@ -178,23 +178,6 @@ TEST(UlfDiagnosis, NoSmallChangeOfTheCompromiseViolatesLess)
         }
 }
 
-TEST(UlfDiagnosis, WhereThereIsAnAnswerTheCompromiseIsTheShortest)
-{
-    for (int seed = 0; seed < kSeeds; ++seed) {
-        CUlfPlanter planter(static_cast<std::uint64_t>(seed));
-        const T_PLANTED p = planter.Plant(seed % 2 ? PLANT::Degenerate : PLANT::Scaled, 2,
-                                          seed % 3 - 1, 4 + seed, 30);
-        T_ULF_COMPROMISE c;
-        ASSERT_EQ(1, CUlfDiagnosis().Compromise(p.Problem(), c));
-        EXPECT_EQ(0.0, c.sumOfSquares);
-        double size = 0.0;
-        for (std::size_t j = 0; j < p.x.size(); ++j)
-            size = std::max(size, p.weights[j] * std::fabs(p.x[j]));
-        for (std::size_t j = 0; j < p.x.size(); ++j)
-            EXPECT_NEAR(p.x[j], c.factors[j], 1e-8 * size / p.weights[j]) << "seed " << seed;
-    }
-}
-
 TEST(UlfDiagnosis, AContradictionIsMinimal)
 {
     for (const PLANT kind : {PLANT::NoEqualities, PLANT::NoRows, PLANT::WrongSign})
@@ -218,35 +201,19 @@ TEST(UlfDiagnosis, AContradictionIsMinimal)
         }
 }
 
-TEST(UlfDiagnosis, AContradictionOfThreeRowsIsNamedAmongOthers)
-{
-    // x1 + x2 <= 1 (row 1), x1 >= 1 (row 3), x2 >= 1 (row 4)
-    const T_VECTOR rows{1, -1, 1, 1, 2, 1, -1, 0, 0, -1}, rhs{0, 1, 50, -1, -1}, weights{1, 1};
-    const T_ULF_PROBLEM p{2, 1, rows, rhs, weights, 1, 1};
-    const T_ULF_CONFLICT c = CUlfDiagnosis().Conflict(p, {});
-    EXPECT_EQ(ULF_CONFLICT::Found, c.state);
-    EXPECT_FALSE(c.sign);
-    // with x1 = x2 (row 0) one of the two lower bounds is enough
-    EXPECT_TRUE((c.rows == std::vector<int>{1, 3, 4}) || (c.rows == std::vector<int>{0, 1, 3}) ||
-                (c.rows == std::vector<int>{0, 1, 4}));
-}
-
 TEST(UlfDiagnosis, TheSearchReportsAndCanBeCancelled)
 {
     CUlfPlanter planter(1);
     const T_PLANTED p = planter.Plant(PLANT::NoRows, 2, 0, 8, 30);
-    int calls = 0, last = -1;
-    EXPECT_EQ(ULF_CONFLICT::Found, CUlfDiagnosis()
-                                       .Conflict(p.Problem(),
-                                                 [&](int tried, int members) {
-                                                     EXPECT_EQ(last + 1, tried);
-                                                     EXPECT_LT(tried, members);
-                                                     last = tried;
-                                                     ++calls;
-                                                     return true;
-                                                 })
-                                       .state);
-    EXPECT_GT(calls, 1);
+    int last = -1;
+    const auto count = [&](int tried, int members) {
+        EXPECT_EQ(last + 1, tried);
+        EXPECT_LT(tried, members);
+        last = tried;
+        return true;
+    };
+    EXPECT_EQ(ULF_CONFLICT::Found, CUlfDiagnosis().Conflict(p.Problem(), count).state);
+    EXPECT_GT(last, 0);
     const T_ULF_CONFLICT c =
         CUlfDiagnosis().Conflict(p.Problem(), [](int tried, int) { return tried < 1; });
     EXPECT_EQ(ULF_CONFLICT::Cancelled, c.state);

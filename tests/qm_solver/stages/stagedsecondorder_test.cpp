@@ -148,39 +148,6 @@ TEST(StagedSecondOrder, GeometricStiffnessIsTheIntegralOfSlopes)
             EXPECT_NEAR(sum[i][j], k[i][j], 1e-5) << i << " " << j;
 }
 
-TEST(StagedSecondOrder, AHingeInTheBeamIsAHingeAtItsSupport)
-{
-    // A beam with a load on its span and a compression: hinged by releases at ends that do not
-    // turn, and without releases at ends that do.
-    T_RESULT r[2];
-    for (const bool released : {false, true}) {
-        T_FRAME frame = Empty();
-        AddNode(frame, {0, 0, 0});
-        AddNode(frame, {5, 0, 0});
-        Join(frame, kBeam, 0, 1);
-        FixAll(frame, 0);
-        Fix(frame, 1, {1, 2, 3, 4, 5});
-        for (const std::size_t n : {0, 1})
-            frame.nodes[n].fixed[4] = released;
-        frame.elements[0].releaseI[4] = frame.elements[0].releaseJ[4] = released;
-        T_LOAD_CASE load;
-        load.nodal.push_back({1, {-800, 0, 0, 0, 0, 0}});
-        load.beam.push_back({0, BEAM_LOAD::Distributed, true, 2, {-3, -5}, {0.1, 0.8}});
-        T_STAGED_MODEL model = OneStage(frame, 1);
-        model.options.geometricStiffness = true;
-        CStagedSolver staged;
-        Build(staged, model, {load});
-        r[released] = Case(staged, 0, 0);
-    }
-    for (std::size_t at = 0; at < kBeamPositions; ++at)
-        for (std::size_t k = 0; k < 6; ++k)
-            EXPECT_NEAR(r[0].force[0][at][k], r[1].force[0][at][k], 1e-9) << at << " " << k;
-    EXPECT_NEAR(0, r[1].force[0][4][4], 1e-9);
-    // Both hinges turn by the load, so that the compression adds to the moment at mid-span.
-    const double w = 0.5 * 0.7 * 5 * 8;
-    EXPECT_GT(std::fabs(r[1].force[0][2][4]), 1.3 * w * 5 / 8);
-}
-
 TEST(StagedSecondOrder, ATightStringStiffensAcrossItself)
 {
     // Two strings of 5 with tension T: a load across gives P L / 2T; without T it is a mechanism.
@@ -211,39 +178,6 @@ TEST(StagedSecondOrder, ATightStringStiffensAcrossItself)
     EXPECT_FALSE(staged.Run(std::vector<T_LOAD_CASE>{load}, error));
     EXPECT_EQ(SOLVER_FAULT::Mechanism, error.fault);
     EXPECT_EQ(1, error.node);
-}
-
-TEST(StagedSecondOrder, ALeaningStrutPushesAlongItsDisplacedChord)
-{
-    // A spring k holds the top against H; then a strut comes below it, and a load P: P leans by the
-    // whole displacement, so that k u = H + P u / L.
-    const double k = 200.0, h = 10.0, p = 300.0, length = 5.0;
-    T_FRAME frame = Empty();
-    AddNode(frame, {0, 0, 0});
-    AddNode(frame, {0, 0, length});
-    Fix(frame, 0, {0, 1, 2});
-    Fix(frame, 1, {1, 2});
-    Join(frame, ELEMENT_KIND::Spring, 1, 0, {k, 0, 0, 0, 0, 0});
-    Join(frame, kTruss, 0, 1);
-    T_STAGED_MODEL model = OneStage(frame, 2);
-    model.options.geometricStiffness = true;
-    model.stages[0].activateElements = {0};
-    model.stages[0].activateLoads = {{0, 1}};
-    T_STAGE strut;
-    strut.activateElements = {1};
-    strut.deactivateSupports = {{1, {false, false, true, false, false, false}}};
-    strut.activateLoads = {{1, 1}};
-    model.stages.push_back(strut);
-    CStagedSolver staged;
-    std::vector<T_LOAD_CASE> cases = Push(1, p, h);
-    std::swap(cases[0], cases[1]); // H first
-    Build(staged, model, cases);
-    T_RESULT r;
-    ASSERT_TRUE(staged.ReadSum(0, kLastStep, STAGE_SUM::All, r));
-    EXPECT_NEAR(h / k, r.displacement[1][0], 1e-13);
-    ASSERT_TRUE(staged.ReadSum(1, kLastStep, STAGE_SUM::All, r));
-    EXPECT_NEAR(h / (k - p / length), r.displacement[1][0], 1e-12);
-    EXPECT_NEAR(-p, r.force[1][0][0], 1e-9);
 }
 
 // ---- sag ----------------------------------------------------------------------------------------
@@ -333,17 +267,6 @@ TEST(StagedSecondOrder, CablesWithSagBalanceTheirLoad)
         EXPECT_GT(staged.Cost().iterations, 2u);
         EXPECT_LT(staged.Cost().iterations, 50u);
     }
-}
-
-TEST(StagedSecondOrder, WithoutAxialForcesItIsTheFirstOrder)
-{
-    T_STAGED_MODEL model = Column(3);
-    const std::vector<T_LOAD_CASE> cases = Push(3, 0.0, 5.0);
-    CStagedSolver second, first;
-    Build(second, model, cases);
-    model.options.geometricStiffness = false;
-    Build(first, model, cases);
-    ExpectSame(Case(first, 0, 1), Case(second, 0, 1), 1e-10);
 }
 
 } // namespace

@@ -7,7 +7,7 @@ using namespace sample;
 
 constexpr auto kBeam = ELEMENT_KIND::Beam;
 
-/// A little of everything: releases, offsets, a link, a spring, a diaphragm.
+/// A little of everything: releases, offsets, a link, a spring, and ties whose first node is last.
 T_FRAME Mixed()
 {
     T_FRAME frame = Empty();
@@ -26,7 +26,8 @@ T_FRAME Mixed()
     Join(frame, ELEMENT_KIND::Truss, 0, 4);
     Join(frame, ELEMENT_KIND::Link, 4, 5, {100, 200, 300, 4, 5, 6});
     Join(frame, ELEMENT_KIND::Spring, 5, 0, {10, 20, 30, 0, 0, 0});
-    frame.diaphragms.push_back({{3, 4, 5}, 2});
+    frame.diaphragms.push_back({{5, 3, 4}, 2});
+    frame.equalDisplacements.push_back({{5, 4}, {false, false, true, false, false, false}});
     return frame;
 }
 
@@ -54,11 +55,13 @@ TEST(StagedStatic, EverythingInOneStageIsTheStaticAnalysis)
 
 TEST(StagedStatic, LoadsAfterTheLastBirthAddTheStaticAnalysis)
 {
-    // The frame moves under its weight before the diaphragm, the truss and two beams join.
+    // Two columns move under their weight before the rest joins and their ties with it.
     T_STAGED_MODEL model = OneStage(Mixed(), 3);
     T_STAGE &first = model.stages[0], second;
-    first.activateElements = {0, 1, 2, 6, 7};
-    second.activateElements = {3, 4, 5};
+    first.activateElements = {0, 1};
+    first.activateSupports.pop_back(); // of the third column
+    second.activateElements = {2, 3, 4, 5, 6, 7};
+    second.activateSupports = {{2, {}}};
     first.activateLoads = {{0, kFirstStep}};
     second.steps = 2;
     second.activateLoads = {{1, 2}, {2, 2}};
@@ -72,11 +75,10 @@ TEST(StagedStatic, LoadsAfterTheLastBirthAddTheStaticAnalysis)
     const T_RESULT weight = Case(staged, 1, 0, kFirstStep);
     const T_RESULT columns = Case(staged, 0, 0);
     T_FRAME whole = Mixed();
-    T_LOAD_CASE own; // of the two beams and the truss
+    T_LOAD_CASE own; // of a column, two beams and the truss
     const double w = whole.materials[0].density * whole.sections[0].A * whole.gravity;
-    own.beam.push_back({3, BEAM_LOAD::Distributed, false, 2, {-w, -w}, {0, 1}});
-    own.beam.push_back({4, BEAM_LOAD::Distributed, false, 2, {-w, -w}, {0, 1}});
-    own.beam.push_back({5, BEAM_LOAD::Distributed, false, 2, {-w, -w}, {0, 1}});
+    for (const std::size_t e : {2, 3, 4, 5})
+        own.beam.push_back({e, BEAM_LOAD::Distributed, false, 2, {-w, -w}, {0, 1}});
     ExpectSame(Sum(columns, Solved(whole, own)), weight, 1e-12);
 }
 
