@@ -1,6 +1,6 @@
 // Analyses in a thread of their own: who is told what and where, and how they end.
-#include "modelstoresample.h"
-#include "qm_db/casefile.h"
+#include "casetext.h"
+
 #include "qm_db/dbdoc.h"
 
 #include <gtest/gtest.h>
@@ -10,175 +10,161 @@ namespace {
 
 T_MODEL_CONTENT Staged()
 {
-    T_MODEL_CONTENT c;
-    T_FILE_ERROR error;
-    EXPECT_EQ(1, CCaseFile::Read(QM_TEST_DATA "/cases/stage_all_members.json", c, error));
-    return c;
-}
-
-T_ANALYSIS_OPTIONS StagesOnly()
-{
-    T_ANALYSIS_OPTIONS options;
-    options.allCases = false;
-    return options;
-}
-
-void WaitFor(CDBDoc& doc)
-{
-    for (int i = 0; i < 1000 && doc.PollAnalysis(100); ++i) {
-    }
-    ASSERT_FALSE(doc.IsExcuted());
+    return ParseGood(CaseText("stage_all_members.json"));
 }
 
 using PARTS = std::vector<std::size_t>;
 
+/// A document with construction stages, which alone are analysed.
+class AnalysisWorker : public testing::Test {
+protected:
+    AnalysisWorker()
+    {
+        m_doc.Data().Assign(Staged());
+        m_options.allCases = false;
+    }
+    void Start() { ASSERT_EQ(1, m_doc.StartAnalysis(m_options, m_error)) << m_error.text; }
+    void Wait()
+    {
+        for (int i = 0; i < 1000 && m_doc.PollAnalysis(100); ++i) {
+        }
+        ASSERT_FALSE(m_doc.IsExcuted());
+    }
+    void ExpectCancelled()
+    {
+        EXPECT_EQ(0, m_doc.AnalysisOutcome(m_error));
+        EXPECT_EQ(ANALYSIS_FAULT::Cancelled, m_error.fault) << m_error.text;
+        EXPECT_EQ(nullptr, m_doc.Data().StagedResult());
+    }
+
+    T_ANALYSIS_OPTIONS m_options;
+    T_ANALYSIS_ERROR m_error;
+    CDBDoc m_doc;
+};
+
 } // namespace
 
-TEST(AnalysisWorker, TellsEveryPartInOrderInTheThreadThatAsks)
+TEST_F(AnalysisWorker, TellsEveryPartInOrderInTheThreadThatAsks)
 {
-    CDBDoc doc;
-    doc.Data().Assign(Staged());
     const auto here = std::this_thread::get_id();
     PARTS parts;
-    T_ANALYSIS_OPTIONS options = StagesOnly();
-    options.progress = [&](std::size_t done, std::size_t total) {
+    m_options.progress = [&](std::size_t done, std::size_t total) {
         EXPECT_EQ(here, std::this_thread::get_id());
         EXPECT_EQ(6U, total);
-        EXPECT_TRUE(doc.PollAnalysis()); // not again within
+        EXPECT_TRUE(m_doc.PollAnalysis()); // not again within
         parts.push_back(done);
         return true;
     };
-    T_ANALYSIS_ERROR error;
-    ASSERT_EQ(1, doc.StartAnalysis(options, error)) << error.text;
-    EXPECT_TRUE(doc.IsExcuted());
+    Start();
     std::this_thread::sleep_for(std::chrono::milliseconds(50));
-    EXPECT_TRUE(doc.IsExcuted()); // done or not, until somebody looks
+    EXPECT_TRUE(m_doc.IsExcuted()); // done or not, until somebody looks
     EXPECT_EQ(PARTS{}, parts);
-    EXPECT_FALSE(doc.IsPostMode());
-    WaitFor(doc);
+    EXPECT_FALSE(m_doc.IsPostMode());
+    Wait();
     EXPECT_EQ((PARTS{1, 2, 3, 4, 5, 6}), parts);
-    EXPECT_EQ(1, doc.AnalysisOutcome(error)) << error.text;
-    EXPECT_TRUE(doc.IsPostMode());
+    EXPECT_EQ(1, m_doc.AnalysisOutcome(m_error)) << m_error.text;
+    EXPECT_TRUE(m_doc.IsPostMode());
     parts.clear();
-    ASSERT_EQ(1, doc.RunAnalysis(options, error)) << error.text;
+    ASSERT_EQ(1, m_doc.RunAnalysis(m_options, m_error)) << m_error.text;
     EXPECT_EQ((PARTS{1, 2, 3, 4, 5, 6}), parts);
 }
 
-TEST(AnalysisWorker, RefusesASecondRunAndEditsMeanwhile)
+TEST_F(AnalysisWorker, RefusesASecondRunAndEditsMeanwhile)
 {
-    CDBDoc doc;
-    doc.Data().Assign(Staged());
-    T_ANALYSIS_ERROR error;
-    ASSERT_EQ(1, doc.Edit().Begin("first"));
-    ASSERT_EQ(1, doc.Edit().AddPtns(3, {3, 12.0}));
-    ASSERT_EQ(1, doc.Edit().Commit());
-    ASSERT_EQ(1, doc.Edit().Begin("open"));
-    const T_MODEL before = doc.Data().Model();
-    ASSERT_EQ(1, doc.StartAnalysis(StagesOnly(), error)) << error.text;
-    EXPECT_EQ(0, doc.StartAnalysis(StagesOnly(), error));
-    EXPECT_EQ(ANALYSIS_FAULT::Failed, error.fault);
-    EXPECT_EQ("an analysis of this model is running already", error.text);
-    EXPECT_EQ(0, doc.RunAnalysis(StagesOnly(), error));
-    EXPECT_EQ(0, doc.Edit().AddPtns(3, {3, 13.0}));
-    EXPECT_EQ(0, doc.Edit().Erase<T_ULSI_D>(1));
-    EXPECT_EQ(1, doc.Edit().Commit());
-    EXPECT_EQ(0, doc.Edit().Begin("second"));
-    EXPECT_EQ(0, doc.Undo().Undo());
-    EXPECT_EQ(before, doc.Data().Model());
-    WaitFor(doc);
-    ASSERT_EQ(1, doc.AnalysisOutcome(error)) << error.text;
-    EXPECT_TRUE(doc.IsPostMode());
-    EXPECT_EQ(1, doc.Undo().Undo());
-    EXPECT_EQ(1, doc.Edit().Begin("third"));
+    ASSERT_EQ(1, m_doc.Edit().Begin("first"));
+    ASSERT_EQ(1, m_doc.Edit().AddPtns(3, {3, 12.0}));
+    ASSERT_EQ(1, m_doc.Edit().Commit());
+    ASSERT_EQ(1, m_doc.Edit().Begin("open"));
+    const T_MODEL before = m_doc.Data().Model();
+    Start();
+    EXPECT_EQ(0, m_doc.StartAnalysis(m_options, m_error));
+    EXPECT_EQ(ANALYSIS_FAULT::Failed, m_error.fault);
+    EXPECT_EQ("an analysis of this model is running already", m_error.text);
+    EXPECT_EQ(0, m_doc.RunAnalysis(m_options, m_error));
+    EXPECT_EQ(0, m_doc.Edit().AddPtns(3, {3, 13.0}) + m_doc.Edit().Erase<T_ULSI_D>(1));
+    EXPECT_EQ(1, m_doc.Edit().Commit());
+    EXPECT_EQ(0, m_doc.Edit().Begin("second") + m_doc.Undo().Undo());
+    EXPECT_EQ(before, m_doc.Data().Model());
+    Wait();
+    ASSERT_EQ(1, m_doc.AnalysisOutcome(m_error)) << m_error.text;
+    EXPECT_TRUE(m_doc.IsPostMode());
+    EXPECT_EQ(1, m_doc.Undo().Undo());
+    EXPECT_EQ(1, m_doc.Edit().Begin("third"));
 }
 
-TEST(AnalysisWorker, ACancelledRunLeavesNothingEvenIfTheEngineWasFaster)
+TEST_F(AnalysisWorker, ACancelledRunLeavesNothingEvenIfTheEngineWasFaster)
 {
-    CDBDoc doc;
-    doc.Data().Assign(Staged());
-    T_ANALYSIS_OPTIONS options = StagesOnly();
-    options.allCases = true;
-    options.modes = 1;
-    T_ANALYSIS_ERROR error;
+    m_options.allCases = true;
+    m_options.modes = 1;
     for (const int sleepMs : {0, 100}) {
-        ASSERT_EQ(1, doc.StartAnalysis(options, error)) << error.text;
+        Start();
         std::this_thread::sleep_for(std::chrono::milliseconds(sleepMs));
-        doc.CancelAnalysis();
-        WaitFor(doc);
-        EXPECT_EQ(0, doc.AnalysisOutcome(error));
-        EXPECT_EQ(ANALYSIS_FAULT::Cancelled, error.fault) << error.text;
-        EXPECT_EQ(nullptr, doc.Data().StagedResult());
-        EXPECT_TRUE(doc.Data().Content().staticResults.empty());
-        EXPECT_FALSE(doc.Data().IsModified());
+        m_doc.CancelAnalysis();
+        Wait();
+        ExpectCancelled();
+        EXPECT_TRUE(m_doc.Data().Content().staticResults.empty());
+        EXPECT_FALSE(m_doc.Data().IsModified());
     }
-    doc.CancelAnalysis(); // of none
-    EXPECT_EQ(1, doc.RunAnalysis(StagesOnly(), error)) << error.text;
+    m_doc.CancelAnalysis(); // of none
+    m_options.progress = [](std::size_t done, std::size_t) { return done < 3; };
+    EXPECT_EQ(0, m_doc.RunAnalysis(m_options, m_error));
+    ExpectCancelled();
+    m_options = {false, {}, 0, {}};
+    EXPECT_EQ(1, m_doc.RunAnalysis(m_options, m_error)) << m_error.text;
 }
 
-TEST(AnalysisWorker, AModelThatChangedAllTheSameGetsNoResults)
+TEST_F(AnalysisWorker, AModelThatChangedAllTheSameGetsNoResults)
 {
-    CDBDoc doc;
-    doc.Data().Assign(Staged());
-    T_ANALYSIS_ERROR error;
-    ASSERT_EQ(1, doc.StartAnalysis(StagesOnly(), error)) << error.text;
-    doc.Data().ModelForEdit().loadCases.at(3).pretension.at(0).force = 1.0;
-    WaitFor(doc);
-    EXPECT_EQ(0, doc.AnalysisOutcome(error));
-    EXPECT_EQ("the model was changed during the analysis", error.text);
-    EXPECT_EQ(nullptr, doc.Data().StagedResult());
+    Start();
+    m_doc.Data().ModelForEdit().loadCases.at(3).pretension.at(0).force = 1.0;
+    Wait();
+    EXPECT_EQ(0, m_doc.AnalysisOutcome(m_error));
+    EXPECT_EQ("the model was changed during the analysis", m_error.text);
+    EXPECT_EQ(nullptr, m_doc.Data().StagedResult());
 }
 
-TEST(AnalysisWorker, EndsWithItsDocumentAndWithItsModel)
+TEST_F(AnalysisWorker, EndsWithItsDocumentAndWithItsModel)
 {
     const auto token = std::make_shared<int>(0);
-    T_ANALYSIS_OPTIONS options = StagesOnly();
+    T_ANALYSIS_OPTIONS options = m_options;
     options.progress = [token](std::size_t, std::size_t) { return ++*token > 0; };
-    T_ANALYSIS_ERROR error;
     const long own = token.use_count();
     {
         CDBDoc doc;
         doc.Data().Assign(Staged());
-        ASSERT_EQ(1, doc.StartAnalysis(options, error)) << error.text;
+        ASSERT_EQ(1, doc.StartAnalysis(options, m_error)) << m_error.text;
         EXPECT_GT(token.use_count(), own);
     }
     EXPECT_EQ(own, token.use_count());
     EXPECT_EQ(0, *token);
 
-    CDBDoc doc;
-    doc.Data().Assign(Staged());
     T_FILE_ERROR fault;
-    ASSERT_EQ(1, doc.StartAnalysis(options, error)) << error.text;
-    ASSERT_EQ(1, doc.ImportCase(QM_TEST_DATA "/cases/stage_all_members.json", fault));
-    EXPECT_FALSE(doc.IsExcuted());
-    EXPECT_EQ(0, doc.AnalysisOutcome(error));
-    EXPECT_EQ(ANALYSIS_FAULT::Cancelled, error.fault);
-    EXPECT_EQ(nullptr, doc.Data().StagedResult());
-    EXPECT_EQ(own, token.use_count());
+    Start();
+    ASSERT_EQ(1, m_doc.ImportCase(QM_TEST_DATA "/cases/stage_all_members.json", fault));
+    EXPECT_FALSE(m_doc.IsExcuted());
+    ExpectCancelled();
 
     // Also from within its own progress.
-    options.progress = [&](std::size_t, std::size_t) {
-        EXPECT_EQ(1, doc.ImportCase(QM_TEST_DATA "/cases/stage_all_members.json", fault));
+    m_options.progress = [&](std::size_t, std::size_t) {
+        EXPECT_EQ(1, m_doc.ImportCase(QM_TEST_DATA "/cases/stage_all_members.json", fault));
         return true;
     };
-    EXPECT_EQ(0, doc.RunAnalysis(options, error));
-    EXPECT_EQ(ANALYSIS_FAULT::Cancelled, error.fault);
-    EXPECT_EQ(1, doc.Edit().Begin("free"));
+    EXPECT_EQ(0, m_doc.RunAnalysis(m_options, m_error));
+    EXPECT_EQ(ANALYSIS_FAULT::Cancelled, m_error.fault);
+    EXPECT_EQ(1, m_doc.Edit().Begin("free"));
 }
 
-TEST(AnalysisWorker, WhatTheProgressThrowsEndsTheRun)
+TEST_F(AnalysisWorker, WhatTheProgressThrowsEndsTheRun)
 {
-    CDBDoc doc;
-    doc.Data().Assign(Staged());
-    T_ANALYSIS_OPTIONS options = StagesOnly();
-    options.progress = [](std::size_t, std::size_t) -> bool { throw std::runtime_error("stop"); };
-    T_ANALYSIS_ERROR error;
-    EXPECT_THROW((void)doc.RunAnalysis(options, error), std::runtime_error);
-    EXPECT_FALSE(doc.IsExcuted());
-    EXPECT_EQ(1, doc.Edit().Begin("free"));
-    EXPECT_EQ(1, doc.RunAnalysis(StagesOnly(), error)) << error.text;
+    m_options.progress = [](std::size_t, std::size_t) -> bool { throw std::runtime_error("stop"); };
+    EXPECT_THROW((void)m_doc.RunAnalysis(m_options, m_error), std::runtime_error);
+    EXPECT_FALSE(m_doc.IsExcuted());
+    EXPECT_EQ(1, m_doc.Edit().Begin("free"));
+    m_options.progress = {};
+    EXPECT_EQ(1, m_doc.RunAnalysis(m_options, m_error)) << m_error.text;
 }
 
-TEST(AnalysisWorker, CancelsAndJoinsAJobThatWouldNeverEnd)
+TEST(AnalysisJob, CancelsAndJoinsAJobThatWouldNeverEnd)
 {
     std::atomic<bool> ended = false;
     const auto here = std::this_thread::get_id();
@@ -198,7 +184,7 @@ TEST(AnalysisWorker, CancelsAndJoinsAJobThatWouldNeverEnd)
     EXPECT_TRUE(ended);
 }
 
-TEST(AnalysisWorker, WhatTheJobThrowsBecomesAnError)
+TEST(AnalysisJob, WhatTheJobThrowsBecomesAnError)
 {
     struct T_ROW {
         CAnalysisWorker::JobFn job;

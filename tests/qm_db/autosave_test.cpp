@@ -1,8 +1,9 @@
+#include "tempfolder.h"
+
 #include "qm_db/autosave.h"
 #include "qm_db/dbdoc.h"
 
 #include <filesystem>
-#include <fstream>
 #include <gtest/gtest.h>
 
 namespace fs = std::filesystem;
@@ -14,17 +15,12 @@ class Autosave : public testing::Test {
 protected:
     Autosave()
     {
-        fs::remove_all(m_folder);
-        fs::create_directory(m_folder);
-        m_doc = std::make_unique<CDBDoc>();
         Move(1.0);
         T_FILE_ERROR error;
         EXPECT_EQ(1, m_doc->SaveAs(m_file, error)) << error.text;
         m_autosave = std::make_unique<CAutosave>(*m_doc);
         m_autosave->Follow(m_file);
     }
-    ~Autosave() override { fs::remove_all(m_folder); }
-
     void Move(double x)
     {
         T_NODE_D node;
@@ -72,17 +68,14 @@ protected:
     void Damage(long sequence) const
     {
         const std::string path = m_file + ".auto-" + std::to_string(sequence);
-        constexpr std::size_t kPage = 4096; // all but the first
-        const std::string junk(fs::file_size(path) - kPage, '\x5a');
-        std::fstream file(path, std::ios::in | std::ios::out | std::ios::binary);
-        file.seekp(kPage);
-        file << junk;
+        std::string bytes = ReadText(path);
+        std::fill(bytes.begin() + 4096, bytes.end(), '\x5a'); // all pages but the first
+        WriteText(path, bytes);
     }
 
-    std::string m_folder = testing::TempDir() + "qm_autosave_" +
-                           testing::UnitTest::GetInstance()->current_test_info()->name();
-    std::string m_file = m_folder + "/frame.qmdb";
-    std::unique_ptr<CDBDoc> m_doc;
+    CTempFolder m_folder;
+    std::string m_file = m_folder / "frame.qmdb";
+    std::unique_ptr<CDBDoc> m_doc = std::make_unique<CDBDoc>();
     std::unique_ptr<CAutosave> m_autosave;
     double m_nowS = 0.0;
 };

@@ -1,39 +1,18 @@
 #include "qm_db/filectrl.h"
 
-#include <filesystem>
-#include <fstream>
+#include "tempfolder.h"
+
 #include <gtest/gtest.h>
 #include <sys/resource.h>
-#include <unistd.h>
 
 namespace fs = std::filesystem;
 
 namespace {
 
-/// A folder of its own per test, removed at the end.
 class FileCtrl : public testing::Test {
 protected:
-    FileCtrl()
-        : m_folder(testing::TempDir() + "filectrl_test_" + std::to_string(getpid()) + "/"),
-          m_path(m_folder + "frame.json")
-    {
-        fs::create_directory(m_folder);
-    }
-    ~FileCtrl() override { fs::remove_all(m_folder); }
-
-    std::size_t FileCount() const
-    {
-        return static_cast<std::size_t>(
-            std::distance(fs::directory_iterator(m_folder), fs::directory_iterator()));
-    }
-    static std::string TextOf(const std::string& path)
-    {
-        std::ifstream in(path, std::ios::binary);
-        return {std::istreambuf_iterator<char>(in), {}};
-    }
-
-    std::string m_folder;
-    std::string m_path;
+    CTempFolder m_folder;
+    std::string m_path = m_folder / "frame.json";
     T_FILE_ERROR m_error;
 };
 
@@ -61,35 +40,35 @@ TEST_F(FileCtrl, KeepsTheOldFileWhenTheDiskIsFull)
     }
     EXPECT_EQ(FILE_FAULT::NoAccess, m_error.fault);
     EXPECT_EQ(0U, m_error.text.find(m_path + ": can't write: ")) << m_error.text;
-    EXPECT_EQ("old", TextOf(m_path));
-    EXPECT_EQ(1U, FileCount());
+    EXPECT_EQ("old", ReadText(m_path));
+    EXPECT_EQ(std::vector<std::string>{"frame.json"}, m_folder.Names());
     EXPECT_EQ(0, CFileCtrl::WriteWholeFile("/dev/full", "n", m_error));
     EXPECT_EQ(FILE_FAULT::NoAccess, m_error.fault);
 }
 
 TEST_F(FileCtrl, KeepsLinkAndPermissions)
 {
-    const std::string link = m_folder + "link.json";
+    const std::string link = m_folder / "link.json";
     ASSERT_EQ(1, CFileCtrl::WriteWholeFile(m_path, "old", m_error));
     fs::permissions(m_path, fs::perms(0640));
     fs::create_symlink("frame.json", link);
     ASSERT_EQ(1, CFileCtrl::WriteWholeFile(link, "new", m_error)) << m_error.text;
     EXPECT_TRUE(fs::is_symlink(link));
-    EXPECT_EQ("new", TextOf(m_path));
+    EXPECT_EQ("new", ReadText(m_path));
     EXPECT_EQ(fs::perms(0640), fs::status(m_path).permissions());
 }
 
 TEST_F(FileCtrl, RefusesWhatIsNoFile)
 {
     std::string text = "as it was";
-    EXPECT_EQ(0, CFileCtrl::ReadWholeFile(m_folder, text, m_error));
+    EXPECT_EQ(0, CFileCtrl::ReadWholeFile(m_folder.Path(), text, m_error));
     EXPECT_EQ(FILE_FAULT::NoAccess, m_error.fault);
     EXPECT_EQ(0, CFileCtrl::ReadWholeFile(m_path, text, m_error));
     EXPECT_EQ(m_path + ": can't open: No such file or directory", m_error.text);
     EXPECT_EQ("as it was", text);
-    EXPECT_EQ(0, CFileCtrl::WriteWholeFile(m_folder, "x", m_error));
-    EXPECT_EQ(0, CFileCtrl::WriteWholeFile(m_folder + "none/x", "x", m_error));
-    EXPECT_EQ(0U, FileCount());
+    EXPECT_EQ(0, CFileCtrl::WriteWholeFile(m_folder.Path(), "x", m_error));
+    EXPECT_EQ(0, CFileCtrl::WriteWholeFile(m_folder / "none/x", "x", m_error));
+    EXPECT_TRUE(m_folder.Names().empty());
 }
 
 } // namespace

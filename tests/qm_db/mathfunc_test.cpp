@@ -1,7 +1,8 @@
 #include "qm_db/mathfunc.h"
 
+#include "numbers.h"
+
 #include <gtest/gtest.h>
-#include <limits>
 
 namespace {
 
@@ -13,16 +14,12 @@ struct T_CASE {
     T_POINT2 at;
 };
 
-constexpr double kFar = 1e48, kNan = std::numeric_limits<double>::quiet_NaN();
+constexpr double kFar = 1e48;
 
 // clang-format off
 const T_CASE kCases[] = {
-    { "plain",            {0, 0}, {2, 2},       {0, 2}, {4, 0},          1, 1.0 / 3, {4.0 / 3,
-     4.0 / 3} },
-    { "radial to 1e48",   {0, 0}, {kFar, kFar}, {0, 2}, {4, 0},          1, 1.0 / 3, {4.0 / 3,
-     4.0 / 3} },
-    { "axes of two units",{0, 0}, {2e6, 2e-6},  {0, 2e-6}, {4e6, 0},     1, 1.0 / 3, {4e6 / 3,
-     4e-6 / 3} },
+    { "radial to 1e48",   {0, 0}, {kFar, kFar}, {0, 2}, {4, 0}, 1, 1.0 / 3, {4.0 / 3, 4.0 / 3} },
+    { "two units",       {0, 0}, {2e6, 2e-6}, {0, 2e-6}, {4e6, 0}, 1, 1.0 / 3, {4e6 / 3, 4e-6 / 3}},
     { "touch at its end", {0, 0}, {1, 0},       {1, 0}, {1, 5},          1, 0.0,     {1, 0} },
     { "inside 1e-9",      {0, 0}, {1 - 5e-10, 0}, {1, -1}, {1, 1},       1, 0.5,     {1, 0} },
     { "clamped to Q",     {0, 0}, {2, 0},       {1, 5e-10}, {1, 1 + 5e-10}, 1, 0.0,  {1, 5e-10} },

@@ -1,4 +1,4 @@
-// The solver against enumeration of all active sets, and against the simplex library.
+// The solver against enumeration of all active sets.
 #include "ulfplanted.h"
 
 #include "qm_db/rps_unknownloadfactormanager.h"
@@ -7,9 +7,6 @@
 
 #define EIGEN_MPL2_ONLY
 #include <Eigen/Dense>
-#include <coin/ClpSimplex.hpp>
-#include <coin/CoinPackedMatrix.hpp>
-#include <coin/CoinPackedVector.hpp>
 #include <optional>
 
 namespace {
@@ -19,6 +16,7 @@ using T_LONG_MATRIX = Eigen::Matrix<long double, Eigen::Dynamic, Eigen::Dynamic>
 
 constexpr int kSmallProblems = 400;
 constexpr long double kMetTol = 1e-9L; // rows of small integers
+constexpr double kLess = 1e-6;         // of an objective that nothing may reach
 
 /// Row * y <= b, or = b.
 struct T_HALF {
@@ -132,58 +130,6 @@ int EnumeratedCode(const T_PLANTED& p)
     return Shortest(Halves(p, true), p.nVar) ? 0 : 7;
 }
 
-/// Optimum of objective 1 or 3 by the library, on the rows as given; empty: infeasible.
-/// Unknowns: p - q for each factor, and the bound of |w x|.
-std::optional<double> LibraryOptimum(const T_PLANTED& p)
-{
-    const int n = p.nVar, m = static_cast<int>(p.rhs.size());
-    CoinPackedMatrix matrix(false, 0.0, 0.0);
-    matrix.setDimensions(0, 2 * n + 1);
-    std::vector<double> low, high, cost(static_cast<std::size_t>(2 * n + 1), 0.0);
-    double load = 0.0; // the library's tolerances are absolute: rows and loads of the size of 1
-    for (const double b : p.rhs)
-        load = std::max(load, std::fabs(b));
-    if (!(load > 0.0)) load = 1.0;
-    const auto add = [&](const CoinPackedVector& row, double rowLow, double rowHigh) {
-        matrix.appendRow(row);
-        low.push_back(rowLow);
-        high.push_back(rowHigh);
-    };
-    for (int i = 0; i < m; ++i) {
-        CoinPackedVector row;
-        double size = 0.0;
-        for (const double a : p.Problem().Row(static_cast<std::size_t>(i)))
-            size = std::max(size, std::fabs(a));
-        if (!(size > 0.0)) size = 1.0;
-        for (int j = 0; j < n; ++j) {
-            const double a = p.rows[static_cast<std::size_t>(i * n + j)] / size;
-            row.insert(j, a);
-            row.insert(n + j, -a);
-        }
-        const double b = p.rhs[static_cast<std::size_t>(i)] / size / load;
-        add(row, i < p.nEq ? b : -COIN_DBL_MAX, b);
-    }
-    std::vector<double> colHigh(cost.size(), COIN_DBL_MAX), colLow(cost.size(), 0.0);
-    for (int j = 0; j < n; ++j) {
-        const double w = p.weights[static_cast<std::size_t>(j)];
-        for (const int column : {j, n + j}) {
-            if (p.objective == 1) cost[static_cast<std::size_t>(column)] = w;
-            CoinPackedVector row;
-            row.insert(column, w);
-            row.insert(2 * n, -1.0);
-            if (p.objective == 3) add(row, -COIN_DBL_MAX, 0.0);
-        }
-        if (p.sign != 0) colHigh[static_cast<std::size_t>(p.sign > 0 ? n + j : j)] = 0.0;
-    }
-    if (p.objective == 3) cost.back() = 1.0;
-    ClpSimplex model;
-    model.setLogLevel(0);
-    model.loadProblem(matrix, colLow.data(), colHigh.data(), cost.data(), low.data(), high.data());
-    model.primal();
-    if (!model.isProvenOptimal()) return std::nullopt;
-    return load * model.objectiveValue();
-}
-
 int Solve(const T_PLANTED& p, std::vector<double>& x)
 {
     x.assign(p.weights.size(), 7.0);
@@ -217,13 +163,11 @@ TEST(UlfDifferential, SmallProblemsAgreeWithEnumerationOfAllActiveSets)
         ASSERT_EQ(EnumeratedCode(p), code) << "seed " << seed;
         if (code != 0) continue;
         ++solved;
-        std::vector<T_HALF> rows = Halves(p, true);
-        if (p.objective != 2) {
-            const std::optional<double> optimum = LibraryOptimum(p);
-            ASSERT_TRUE(optimum) << "seed " << seed;
-            EXPECT_NEAR(*optimum, Objective(p, x), 1e-9) << "seed " << seed;
-            AddObjective(p, *optimum, rows);
-        }
+        const std::vector<T_HALF> all = Halves(p, true);
+        std::vector<T_HALF> rows = all, better = all;
+        AddObjective(p, Objective(p, x), rows);
+        AddObjective(p, Objective(p, x) - kLess, better);
+        EXPECT_TRUE(p.objective == 2 || !Shortest(better, p.nVar)) << "seed " << seed;
         const std::optional<T_LONG_VECTOR> y = Shortest(rows, p.nVar);
         ASSERT_TRUE(y) << "seed " << seed;
         for (std::size_t j = 0; j < x.size(); ++j)
@@ -233,45 +177,4 @@ TEST(UlfDifferential, SmallProblemsAgreeWithEnumerationOfAllActiveSets)
     }
     EXPECT_GT(solved, kSmallProblems / 4); // the sample holds both kinds
     EXPECT_LT(solved, kSmallProblems * 3 / 4);
-}
-
-TEST(UlfDifferential, LinearObjectivesReachTheLibrarysOptimum)
-{
-    for (int seed = 0; seed < 120; ++seed) {
-        CUlfPlanter planter(static_cast<std::uint64_t>(seed));
-        const int n = 3 + seed % 13;
-        // a square-sum plant only makes sure that there is a solution: the optimum is not known
-        T_PLANTED p = planter.Plant(seed % 2 ? PLANT::Plain : PLANT::Degenerate, 2, seed % 3 - 1, n,
-                                    n + seed % 40);
-        p.objective = seed % 4 < 2 ? 1 : 3;
-        std::vector<double> x;
-        ASSERT_EQ(0, Solve(p, x)) << "seed " << seed;
-        const std::optional<double> optimum = LibraryOptimum(p);
-        ASSERT_TRUE(optimum) << "seed " << seed;
-        EXPECT_NEAR(1.0, Objective(p, x) / *optimum, 1e-6) << "seed " << seed;
-    }
-}
-
-TEST(UlfDifferential, ContradictionsAgreeWithTheLibrary)
-{
-    int contradictions = 0;
-    for (int seed = 0; seed < 200; ++seed) {
-        CUlfPlanter random(static_cast<std::uint64_t>(seed));
-        T_PLANTED p;
-        p.nVar = 4;
-        p.objective = 1;
-        p.sign = seed % 3 - 1;
-        for (int i = 0; i < 10; ++i) {
-            for (int j = 0; j < p.nVar; ++j)
-                p.rows.push_back(random.Uniform(-1.0, 1.0));
-            p.rhs.push_back(random.Uniform(-1.0, 1.5));
-        }
-        p.weights.assign(4, 1.0);
-        std::vector<double> x;
-        const int code = Solve(p, x);
-        EXPECT_EQ(!LibraryOptimum(p), code != 0) << "seed " << seed;
-        contradictions += code != 0;
-    }
-    EXPECT_GT(contradictions, 20);
-    EXPECT_LT(contradictions, 180);
 }

@@ -1,44 +1,16 @@
-#include "qm_db/casefile.h"
+#include "casetext.h"
+#include "numbers.h"
 
 #include "qm_base/textformat.h"
 #include "qm_db/casefile/jsonnumber.h"
-#include "qm_db/filectrl.h"
 
-#include <gtest/gtest.h>
-#include <limits>
 #include <random>
 
 namespace {
 
-const std::string kCases = std::string(QM_TEST_DATA) + "/cases/";
-
-std::string TextOf(const std::string& path)
-{
-    std::string text;
-    T_FILE_ERROR error;
-    EXPECT_EQ(1, CFileCtrl::ReadWholeFile(path, text, error)) << error.text;
-    return text;
-}
-
 const std::string& AllMembers()
 {
-    static const std::string text = TextOf(kCases + "all_members.json");
-    return text;
-}
-
-T_MODEL_CONTENT ParseGood(const std::string& text)
-{
-    T_MODEL_CONTENT content;
-    T_FILE_ERROR error;
-    EXPECT_EQ(1, CCaseFile::Parse(text, "case.json", kCases, content, error)) << error.text;
-    return content;
-}
-
-std::string PrintGood(const T_MODEL_CONTENT& content)
-{
-    std::string text;
-    T_FILE_ERROR error;
-    EXPECT_EQ(1, CCaseFile::Print(content, text, error)) << error.text;
+    static const std::string text = CaseText("all_members.json");
     return text;
 }
 
@@ -57,7 +29,7 @@ std::string RefusalOf(const std::string& text)
     content.model.styp.title = "as it was";
     const T_MODEL before = content.model;
     T_FILE_ERROR error;
-    EXPECT_EQ(0, CCaseFile::Parse(text, "case.json", kCases, content, error));
+    EXPECT_EQ(0, CCaseFile::Parse(text, "case.json", "", content, error));
     EXPECT_EQ(FILE_FAULT::BadInput, error.fault);
     EXPECT_EQ(before, content.model);
     EXPECT_TRUE(content.results.empty());
@@ -99,9 +71,7 @@ const T_BAD kBad[] = {
     {"\"id\": 2", "-0.5, ", "", "nodes[1].xyz: 2 values, expected 3"},
     {"\"id\": 2", "-0.5", "1e308", "OK"}, // becomes 2.54e306 m
     {"\"id\": 2", "2.6473775", "1e308", "nodes[1]: a value is too large"}, // 1.75e313 kg
-    {"\"id\": 2", "2.6473775, 1.035643, 0.71607127", "0, 0, 0", "OK"},
     {"\"id\": 2", "\"mass\": [2.6473775, 1.035643, 0.71607127], ", "", "OK"},
-    {"\"id\": 2", ", \"restraint\": [0, 1, 0, 1, 0, 1]", "", "OK"},
     {"\"restraint\"", "1, 1, 1", "1, 2, 1", "nodes[0].restraint[1]: a restraint is 0 or 1"},
     // storeys
     {"storeys", "\"1F\"", "\"\"", "storeys[0].name: a name can't be empty"},
@@ -124,18 +94,10 @@ const T_BAD kBad[] = {
      "spectra[1].damping: damping can't be negative"},
     {"\"ec8-2004\"", "\"TB\": 0.1", "\"TB\": 0.5", "spectra[1].TC: TC is below TB"},
     {"\"ec8-2004\"", "\"TD\": 2.5", "\"TD\": 0.3", "spectra[1].TD: TD is below TC"},
-    {"\"ec8-2004\"", "\"TC\": 0.4,\n   \"TD\": 2.5", "\"TD\": 0.05",
-     "spectra[1].TD: TD is below TB"},
-    {"\"ec8-1994\"", "\"B\"", "\"D\"", "spectra[2].soil: unknown soil \"D\"; allowed: A, B, C"},
-    {"\"ntc\"", "T3", "T5",
-     "spectra[3].topography: unknown topography \"T5\"; allowed: T1, T2, T3, T4"},
-    {"\"ntc\"", "0.104", "0", "spectra[3].limit_states.SLD.ag: the value must be above 0"},
-    {"\"ntc\"", "2.33", "0", "spectra[3].limit_states.SLD.F0: the value must be above 0"},
     {"\"ntc\"", "0.28", "0", "spectra[3].limit_states.SLD.\"TC*\": the value must be above 0"},
     {"\"user\",", "[0, 0.5", "[-1, 0.5", "spectra[4].T[0]: a period can't be negative"},
     {"\"user\",", "386.4", "-1", "spectra[4].gravity: gravity must be above 0"},
     // pushover load cases
-    {"pushover", "\"RZ\"", "\"PX\"", "pushover[1].name: \"PX\" appears twice"},
     {"pushover", ", \"modes\": [1]", "",
      "pushover[0].pattern: this kind of pattern needs at least one mode number in \"modes\""},
     {"pushover", "[1]", "[2]", "pushover[0].pattern.modes[0]: there is no such mode"},
@@ -143,17 +105,12 @@ const T_BAD kBad[] = {
     {"pushover", "180", "1e308", "pushover[0].steps.base_reaction: a value is too large"},
     {"pushover", "\"2\"", "\"7\"", "pushover[0].steps.displacement: key \"7\" appears twice"},
     {"pushover", "-2]", "-3]", "pushover[0].limit_state_steps.EC8[2]: a step is -2 or above"},
-    {"pushover", "-2]", "-2, 1]", "pushover[0].limit_state_steps.EC8: 4 values, expected 3"},
     // evaluations
     {"evaluations", "FEMA440", "NTC2008",
      "evaluations[0].procedure: only ATC-40 and FEMA440 have procedures"},
-    {"evaluations", "\"C\"", "\"D\"",
-     "evaluations[0].procedure: unknown procedure \"D\"; allowed: A, B, C"},
     {"evaluations", "\"behavior\": 3", "\"behavior\": 4",
      "evaluations[0].behavior: the behavior is 0, 1, 2 or 3"},
     {"evaluations", "2.5", "-1", "evaluations[0].elastic_damping: damping is 0 to 100 per cent"},
-    {"evaluations", "[10, 1, 40, 0.7]", "[10, 1, 40]",
-     "evaluations[0].user_damping: 3 values, expected 4"},
     {"evaluations", "2.5", "101", "evaluations[0].elastic_damping: damping is 0 to 100 per cent"},
     {"evaluations", "\"drift_kind\": 2", "\"drift_kind\": 3",
      "evaluations[0].drift_kind: the drift kind is 1 or 2"},
@@ -256,41 +213,57 @@ TEST(CaseFile, PrintsNoMoreDigitsThanTheFileHad)
 
 TEST(CaseFile, RefusesToPrintWhatCouldNotBeRead)
 {
-    const T_MODEL_CONTENT good = ParseGood(AllMembers());
     struct T_ROW {
-        const char* message;
+        const char* file;
+        const char* message; // its beginning
         void (*spoil)(T_MODEL_CONTENT&);
     };
-    static constexpr double nan = std::numeric_limits<double>::quiet_NaN();
+    const char *const all = "all_members.json", *const structure = "struct_all_members.json",
+                      *const hinges = "hinge_all_members.json";
     const T_ROW rows[] = {
-        {"nodes[1].xyz: item [1] is not a finite number",
-         [](T_MODEL_CONTENT& c) { c.model.nodes.at(2).xyz[1] = nan; }},
-        {"nodes[0].xyz: item [0] is not a finite number", // 1.7e308 m is no number of inches
+        {all, "nodes[1].xyz: item [1] is not a finite number",
+         [](T_MODEL_CONTENT& c) { c.model.nodes.at(2).xyz[1] = kNan; }},
+        {all, "nodes[0].xyz: item [0] is not a finite number", // 1.7e308 m is no number of inches
          [](T_MODEL_CONTENT& c) { c.model.nodes.at(1).xyz[0] = 1.7e308; }},
-        {"modes[0]: mode numbers must run 1, 2, 3, ...: found 3",
+        {all, "modes[0]: mode numbers must run 1, 2, 3, ...: found 3",
          [](T_MODEL_CONTENT& c) {
-             c.model.modes[3] = c.model.modes.at(1);
-             c.model.modes.erase(1);
+             c.model.modes = {{3, c.model.modes.at(1)}};
          }},
-        {"title: a text is not valid UTF-8",
+        {all, "title: a text is not valid UTF-8",
          [](T_MODEL_CONTENT& c) { c.model.styp.title.assign(1, '\xff'); }},
-        {"pushover[1].direction: no name for the value 6",
+        {all, "pushover[1].direction: no name for the value 6",
          [](T_MODEL_CONTENT& c) { c.model.pushovers.at(2).direction = 7; }},
-        {"pushover[1].steps: the load case \"RZ\" has no results, which a case file can't leave "
-         "out",
+        {all,
+         "pushover[1].steps: the load case \"RZ\" has no results, which a case file can't leave",
          [](T_MODEL_CONTENT& c) { c.results.erase(2); }},
-        {"pushover[0].steps.displacement.\"2\": 1 values, expected 2",
+        {all, "pushover[0].steps.displacement.\"2\": 1 values, expected 2",
          [](T_MODEL_CONTENT& c) {
              c.results[1] = MakePushResult({{1, 2}, {3, 4}, {{2, {1}}, {7, {1, 2}}}});
          }},
+        {structure, "elements[0].material: no name for the key 9",
+         [](T_MODEL_CONTENT& c) { c.model.elements.at(1).material = 9; }},
+        {structure, "combinations[1].items[0].case: no name for the key 2",
+         [](T_MODEL_CONTENT& c) { c.model.combinations.at(2).items[0].key = 2; }},
+        {structure, "ulf_constraints[0]", // without any bound
+         [](T_MODEL_CONTENT& c) {
+             c.model.ulfConstraints.at(1).upper = c.model.ulfConstraints.at(1).lower = {};
+         }},
+        {hinges, "hinge_types[0].components.Mx: a curve is not of the component's type",
+         [](T_MODEL_CONTENT& c) { c.model.hingeTypes.at(1).components[3].type = SKEL_TYPE::Ec8; }},
+        {hinges, "hinge_types[0].definition: no name for the value 3",
+         [](T_MODEL_CONTENT& c) {
+             c.model.hingeTypes.at(1).definition = static_cast<HINGE_DEFINITION>(3);
+         }},
+        {hinges, "materials[1].name: the name appears twice",
+         [](T_MODEL_CONTENT& c) { c.model.materials.at(3).name = "A992"; }},
     };
     for (const T_ROW& row : rows) {
-        T_MODEL_CONTENT content = good;
+        T_MODEL_CONTENT content = ParseGood(CaseText(row.file));
         row.spoil(content);
         std::string text = "as it was";
         T_FILE_ERROR error;
         EXPECT_EQ(0, CCaseFile::Print(content, text, error)) << row.message;
-        EXPECT_EQ(row.message, error.text);
+        EXPECT_TRUE(error.text.starts_with(row.message)) << error.text;
         EXPECT_EQ(FILE_FAULT::BadInput, error.fault);
         EXPECT_EQ("as it was", text);
     }

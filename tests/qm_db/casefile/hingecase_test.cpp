@@ -1,15 +1,13 @@
 // Hinges, and what they refer to, in the case file and in the model file.
 #include "casetext.h"
+#include "numbers.h"
+
 #include "qm_base/msgfunction.h"
 #include "qm_db/records/hingetype.h"
-#include "qm_db/store/sqlitedb.h"
 
 #include <gtest/gtest.h>
-#include <limits>
 
 namespace {
-
-const std::string kData = QM_TEST_DATA;
 
 std::string RichText()
 {
@@ -107,98 +105,62 @@ TEST(HingeCase, BadInputNamesThePlace)
 
 TEST(HingeCase, RefusesToStoreWhatCouldNotBeRead)
 {
-    const struct {
-        const char* caseText;
-        const char* storeText; // after the table and the key
-        void (*spoil)(T_MODEL_CONTENT&);
-    } rows[] = {
-        {"hinge_types[0].components.My.I.positive.yield: the value is not a finite number",
-         "hinge_types 1 components.My.I.positive.yield: the value is not a finite number",
-         [](T_MODEL_CONTENT& c) {
-             FemaI(c).sides.pos.yield = std::numeric_limits<double>::quiet_NaN();
-         }},
-        {"hinge_types[0].components.Mx: a curve is not of the component's type",
-         "hinge_types 1 components.Mx: a curve is not of the component's type",
-         [](T_MODEL_CONTENT& c) { Component(c, HINGE_COMPONENT::Mx).type = SKEL_TYPE::Ec8; }},
-        {"hinge_types[0].definition: no name for the value 3",
-         "hinge_types 1 definition: no name for the value 3",
-         [](T_MODEL_CONTENT& c) {
-             c.model.hingeTypes.at(1).definition = static_cast<HINGE_DEFINITION>(3);
-         }},
-        {"materials[1].name: the name appears twice", nullptr,
-         [](T_MODEL_CONTENT& c) { c.model.materials.at(3).name = "A992"; }},
-    };
+    T_MODEL_CONTENT content = ParseGood(RichText());
+    FemaI(content).sides.pos.yield = kNan;
     const CTempFolder folder;
-    for (const auto& row : rows) {
-        T_MODEL_CONTENT content = ParseGood(RichText());
-        row.spoil(content);
-        std::string text;
-        T_FILE_ERROR error;
-        EXPECT_EQ(0, CCaseFile::Print(content, text, error)) << row.caseText;
-        EXPECT_EQ(0U, error.text.find(row.caseText)) << error.text;
-        if (!row.storeText) continue;
-        const std::string path = folder.File("bad.qmdb");
-        EXPECT_EQ(0, CModelStore().Save(path, content, error)) << row.storeText;
-        EXPECT_EQ(
-            zql::lib::MMSGFunction::Format("IDS_QM_DB_FILE_BAD_RECORD", {path, row.storeText}),
-            error.text);
-        EXPECT_TRUE(folder.Names().empty());
-    }
-}
-
-// The file was written by the program when it knew version 1 only, out of all_members.json.
-TEST(HingeCase, AFileOfVersion1OpensAndIsSavedAsTheCurrentVersion)
-{
-    const CTempFolder folder;
-    const std::string path = folder.File("model.qmdb");
-    WriteBytes(path, BytesOf(kData + "/model-v1.qmdb"));
-    ASSERT_EQ(1, BytesOf(path)[63]); // user_version, last byte
-    T_MODEL_CONTENT source, content, again;
+    const std::string path = folder.File("bad.qmdb");
     T_FILE_ERROR error;
-    ASSERT_EQ(1, CCaseFile::Read(kData + "/cases/all_members.json", source, error)) << error.text;
-    CModelStore store;
-    ASSERT_EQ(1, store.Open(path, OPEN_MODE::Edit, content, error)) << error.text;
-    EXPECT_TRUE(SameContent(source, content));
-
-    const T_MODEL rich = ParseGood(RichText()).model; // and takes what version 1 could not hold
-    content.model.hingeTypes = rich.hingeTypes;
-    content.model.materials = rich.materials;
-    content.model.pushovers.at(1).control = T_POLC_CONTROL{};
-    content.model.styp.gsd = true;
-    ASSERT_EQ(1, store.Save(path, content, error)) << error.text;
-    EXPECT_EQ(4, BytesOf(path)[63]);
-    ASSERT_EQ(1, CModelStore::CheckWhole(path, error)) << error.text;
-    ASSERT_EQ(1, CModelStore().Open(path, OPEN_MODE::ReadOnly, again, error)) << error.text;
-    EXPECT_TRUE(SameContent(content, again));
+    EXPECT_EQ(0, CModelStore().Save(path, content, error));
+    const char* const place =
+        "hinge_types 1 components.My.I.positive.yield: the value is not a finite number";
+    EXPECT_EQ(zql::lib::MMSGFunction::Format("IDS_QM_DB_FILE_BAD_RECORD", {path, place}),
+              error.text);
+    EXPECT_TRUE(folder.Names().empty());
 }
 
-// Files written by the program when it knew version 2: the case file and its model file.
-TEST(HingeCase, FilesWithOlderKeysAndOfVersion2HoldTheSameModel)
+// What version 2 did not know has its default.
+TEST(HingeCase, ATextWithOlderKeysHoldsTheSameModel)
 {
     T_MODEL_CONTENT now = ParseGood(RichText());
-    for (auto& [key, type] : now.model.hingeTypes) { // what version 2 did not know
+    for (auto& [key, type] : now.model.hingeTypes) {
         type.fibreSection = type.thicknessSection = 0;
         for (T_HINGE_COMPONENT& c : type.components)
             for (T_SKEL_CURVE* curve : {&c.curves.I, &c.curves.J})
                 if (auto* fema = std::get_if<T_SKEL_FEMA>(curve)) fema->compliance = true;
     }
-    T_MODEL_CONTENT text, content, again;
-    T_FILE_ERROR error;
-    ASSERT_EQ(1, CCaseFile::Read(kData + "/cases/hinge_old_keys.json", text, error)) << error.text;
-    EXPECT_TRUE(SameContent(now, text));
+    EXPECT_TRUE(SameContent(now, ParseGood(CaseText("hinge_old_keys.json"))));
+}
 
-    const CTempFolder folder;
-    const std::string path = folder.File("model.qmdb");
-    WriteBytes(path, BytesOf(kData + "/model-v2.qmdb"));
-    ASSERT_EQ(2, BytesOf(path)[63]);
-    CModelStore store;
-    ASSERT_EQ(1, store.Open(path, OPEN_MODE::Edit, content, error)) << error.text;
-    EXPECT_TRUE(SameContent(now, content));
-    content.model.loadCases[1] = {"G", {0, 0, -1}, {}, {}, {}, {}, {}};
-    content.model.styp.plane = MODEL_PLANE::XZ;
-    content.model.elements.at(4).release.I[4] = true;
-    ASSERT_EQ(1, store.Save(path, content, error)) << error.text;
-    EXPECT_EQ(4, BytesOf(path)[63]);
-    ASSERT_EQ(1, CModelStore().Open(path, OPEN_MODE::ReadOnly, again, error)) << error.text;
-    EXPECT_TRUE(SameContent(content, again));
+// The model files were written by the program when it knew that version only, out of the texts.
+TEST(HingeCase, FilesOfOlderVersionsOpenAndAreSavedAsTheCurrentVersion)
+{
+    const char* const texts[] = {"all_members.json", "hinge_old_keys.json",
+                                 "struct_all_members.json"};
+    const T_MODEL rich = ParseGood(RichText()).model;
+    for (int version = 1; version <= 3; ++version) {
+        SCOPED_TRACE(version);
+        const CTempFolder folder;
+        const std::string path = folder.File("model.qmdb");
+        WriteBytes(path, BytesOf(QM_TEST_DATA "/model-v" + std::to_string(version) + ".qmdb"));
+        ASSERT_EQ(version, BytesOf(path)[63]); // user_version, last byte
+        T_MODEL_CONTENT content, again;
+        T_FILE_ERROR error;
+        CModelStore store;
+        ASSERT_EQ(1, store.Open(path, OPEN_MODE::Edit, content, error)) << error.text;
+        EXPECT_TRUE(SameContent(ParseGood(CaseText(texts[version - 1])), content));
+
+        T_MODEL& m = content.model; // takes what its version could not hold
+        m.hingeTypes = rich.hingeTypes;
+        m.materials = rich.materials;
+        m.pushovers[1].control = T_POLC_CONTROL{};
+        m.styp.gsd = m.styp.stageControl.cableSag = true;
+        m.styp.plane = MODEL_PLANE::XZ;
+        m.loadCases[1] = {"G", {0, 0, -1}, {}, {}, {}, {}, {}};
+        m.stages[1] = {"S1", {{1}, {1}, {{1, -1}}}, {}, 2, 3.0};
+        ASSERT_EQ(1, store.Save(path, content, error)) << error.text;
+        EXPECT_EQ(4, BytesOf(path)[63]);
+        ASSERT_EQ(1, CModelStore::CheckWhole(path, error)) << error.text;
+        ASSERT_EQ(1, CModelStore().Open(path, OPEN_MODE::ReadOnly, again, error)) << error.text;
+        EXPECT_TRUE(SameContent(content, again));
+    }
 }

@@ -7,19 +7,9 @@
 
 namespace {
 
-const std::string kData = QM_TEST_DATA;
-
 std::string AllText()
 {
-    return BytesOf(kData + "/cases/stage_all_members.json");
-}
-
-std::string UsersAsText(const T_MODEL& model, const T_RECORD_USERS& users)
-{
-    std::string text;
-    for (const T_RECORD_USER& user : users)
-        text += (text.empty() ? "" : ", ") + DescribeUser(model, user);
-    return text;
+    return CaseText("stage_all_members.json");
 }
 
 } // namespace
@@ -46,40 +36,7 @@ TEST(StageCase, ReadsEveryMemberIntoItsField)
 
 TEST(StageCase, CaseFileAndModelFileGiveTheSameModelBack)
 {
-    const T_MODEL_CONTENT content = ParseGood(AllText());
-    const std::string text = PrintGood(content);
-    EXPECT_TRUE(SameContent(content, ParseGood(text)));
-    EXPECT_EQ(text, PrintGood(ParseGood(text)));
-
-    const CTempFolder folder;
-    T_MODEL_CONTENT stored;
-    T_FILE_ERROR error;
-    ASSERT_EQ(1, CModelStore().Save(folder.File("m.qmdb"), content, error)) << error.text;
-    ASSERT_EQ(1, CModelStore().Open(folder.File("m.qmdb"), OPEN_MODE::ReadOnly, stored, error));
-    EXPECT_TRUE(SameContent(content, stored));
-    EXPECT_EQ(text, PrintGood(stored));
-}
-
-// Written by the program when it knew version 3, out of struct_all_members.json.
-TEST(StageCase, AFileOfVersion3OpensAndTakesStages)
-{
-    const CTempFolder folder;
-    const std::string path = folder.File("model.qmdb");
-    WriteBytes(path, BytesOf(kData + "/model-v3.qmdb"));
-    ASSERT_EQ(3, BytesOf(path)[63]); // user_version, last byte
-    T_MODEL_CONTENT source, content, again;
-    T_FILE_ERROR error;
-    ASSERT_EQ(1, CCaseFile::Read(kData + "/cases/struct_all_members.json", source, error));
-    CModelStore store;
-    ASSERT_EQ(1, store.Open(path, OPEN_MODE::Edit, content, error)) << error.text;
-    EXPECT_TRUE(SameContent(source, content));
-    content.model.stages[1] = {"S1", {{1}, {1}, {{1, -1}}}, {}, 2, 3.0};
-    content.model.styp.stageControl.cableSag = true;
-    content.model.ulfConstraints.at(1).stage = 1;
-    ASSERT_EQ(1, store.Save(path, content, error)) << error.text;
-    EXPECT_EQ(4, BytesOf(path)[63]);
-    ASSERT_EQ(1, CModelStore().Open(path, OPEN_MODE::ReadOnly, again, error)) << error.text;
-    EXPECT_TRUE(SameContent(content, again));
+    ExpectRoundTrips(ParseGood(AllText()), "stages");
 }
 
 TEST(StageCase, BadInputNamesThePlace)
@@ -112,15 +69,15 @@ TEST(StageCase, NamesOfStageLoadsGiveTheirKeys)
 {
     CDBDoc doc;
     doc.Data().Assign(ParseGood(AllText()));
+    const std::pair<const char*, int> rows[] = {{"Sum of the stage loads", kStageLoadSum},
+                                                {"Dead load of the stages", kStageLoadDead},
+                                                {"Erection load of the stages", kStageLoadErection},
+                                                {"T", 3}};
     int key = 0;
-    ASSERT_EQ(1, doc.Attr().GetSgldKey("Sum of the stage loads", key));
-    EXPECT_EQ(kStageLoadSum, key);
-    ASSERT_EQ(1, doc.Attr().GetSgldKey("Dead load of the stages", key));
-    EXPECT_EQ(kStageLoadDead, key);
-    ASSERT_EQ(1, doc.Attr().GetSgldKey("Erection load of the stages", key));
-    EXPECT_EQ(kStageLoadErection, key);
-    ASSERT_EQ(1, doc.Attr().GetSgldKey("T", key));
-    EXPECT_EQ(3, key);
+    for (const auto& [name, expected] : rows) {
+        ASSERT_EQ(1, doc.Attr().GetSgldKey(name, key)) << name;
+        EXPECT_EQ(expected, key) << name;
+    }
     EXPECT_EQ(0, doc.Attr().GetSgldKey("U", key));
 }
 
@@ -165,31 +122,6 @@ TEST(StageCase, PretensionIsReplacedInCurrentUnitsAsAStepThatCanBeTakenBack)
     EXPECT_EQ(before, doc.Data().Model());
 }
 
-TEST(StageCase, WhatStagesUseIsNotDeleted)
-{
-    CDBDoc doc;
-    doc.Data().Assign(ParseGood(AllText()));
-    ASSERT_EQ(1, doc.Edit().Begin("erase"));
-    T_RECORD_USERS users;
-    const T_MODEL& m = doc.Data().Model();
-    EXPECT_EQ(0, doc.Edit().Erase<T_ELEM_D>(2, users));
-    EXPECT_EQ("construction stage \"S2\", construction stage \"S3\"", UsersAsText(m, users));
-    EXPECT_EQ(0, doc.Edit().Erase<T_NODE_D>(4, users));
-    EXPECT_EQ("element 3, construction stage \"S3\"", UsersAsText(m, users));
-    EXPECT_EQ(0, doc.Edit().Erase<T_STLD_D>(3, users));
-    EXPECT_EQ("construction stage \"S3\", unknown load factor item \"tune\" of construction stages",
-              UsersAsText(m, users));
-    EXPECT_EQ(0, doc.Edit().Erase<T_STAG_D>(2, users));
-    EXPECT_EQ("constraint \"mid\" of unknown load factors, unknown load factor item \"tune\" of "
-              "construction stages",
-              UsersAsText(m, users));
-    EXPECT_EQ(1, doc.Edit().Erase<T_STLD_D>(4, users));
-    EXPECT_EQ(1, doc.Edit().Erase<T_ULSI_D>(1, users));
-    EXPECT_EQ(1, doc.Edit().Commit());
-    ASSERT_EQ(1, doc.Undo().Undo());
-    EXPECT_EQ(ParseGood(AllText()).model, m);
-}
-
 // The case file has unknown rows before known ones: a record that was put in keeps that order.
 TEST(StageCase, RowsThatAreEditedComeBackFromEveryFile)
 {
@@ -206,10 +138,8 @@ TEST(StageCase, RowsThatAreEditedComeBackFromEveryFile)
     ASSERT_EQ(1, doc.Edit().Commit());
     const T_MODEL back = ParseGood(PrintGood(doc.Data().Content())).model;
     EXPECT_EQ(doc.Data().Model().ulfStageItems, back.ulfStageItems);
-    const std::vector<T_ULSI_ROW>& rows = back.ulfStageItems.at(1).rows;
-    ASSERT_EQ(3U, rows.size());
-    EXPECT_EQ(1, rows[0].stage);
-    EXPECT_EQ(5, rows[1].stage);
-    EXPECT_EQ(1.0, rows[1].factor);
-    EXPECT_EQ((T_ULSI_ROW{2, -1, 2, false, 1.5, 1.0, false, 1}), rows[2]);
+    const std::vector<T_ULSI_ROW> rows{{1, 1, 1, true, 1.0, 1.0, false, 0},
+                                       {5, 2, 3, true, 1.0, 2.0, true, 2},
+                                       {2, -1, 2, false, 1.5, 1.0, false, 1}};
+    EXPECT_EQ(rows, back.ulfStageItems.at(1).rows);
 }

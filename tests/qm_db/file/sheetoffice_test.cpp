@@ -1,10 +1,10 @@
 // A written sheet lives in an office program: formulas are formulas and texts stay texts.
 #include "office.h"
+#include "tempfolder.h"
+
 #include "qm_db/sheetfile.h"
 
-#include <filesystem>
 #include <gtest/gtest.h>
-#include <unistd.h>
 
 namespace {
 
@@ -31,9 +31,8 @@ TEST(SheetOffice, FormulasAreCalculatedAnewAndTextsStayTexts)
 {
     if (!COffice::IsThere()) GTEST_SKIP() << "soffice or python3 is not installed";
     const COffice office;
-    const std::string path = (std::filesystem::temp_directory_path() /
-                              ("qm-sheet-office-" + std::to_string(::getpid()) + ".xlsx"))
-                                 .string();
+    const CTempFolder folder;
+    const std::string path = folder / "product.xlsx";
     T_FILE_ERROR error;
     ASSERT_TRUE(WriteSheet(path, Product(999.0), error)) << error.text;
     const OFFICE_CELLS cells = office.Recalculated(path);
@@ -47,7 +46,6 @@ TEST(SheetOffice, FormulasAreCalculatedAnewAndTextsStayTexts)
     ASSERT_TRUE(COffice::PutNumber(path, "B3", 1.5));
     EXPECT_DOUBLE_EQ(0.1 * 3 + 1.5 * 4 + 0.5, std::stod(office.Recalculated(path)[0][2]));
     EXPECT_FALSE(COffice::PutNumber(path, "B9", 1.5)) << "no such cell";
-    std::filesystem::remove(path);
 }
 
 } // namespace

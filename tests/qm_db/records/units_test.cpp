@@ -47,25 +47,6 @@ TEST(Units, FactorsAreThePublishedOnes)
         EXPECT_NEAR(c.si, SiFactor(c.units, c.dim), c.tol * c.si) << c.label;
 }
 
-TEST(Units, EveryPairGoesToSiAndBack)
-{
-    const T_DIM dims[] = {kDimNone, kDimLength, kDimForce, kDimMoment, kDimMass, kDimStress};
-    for (int f = 0; f < 7; ++f) {
-        for (int l = 0; l < 5; ++l) {
-            const T_UNITS u{static_cast<F>(f), static_cast<L>(l)};
-            for (const T_DIM dim : dims) {
-                const double si = ToSi(12.345, u, dim);
-                EXPECT_DOUBLE_EQ(12.345, FromSi(si, u, dim)) << f << ' ' << l;
-                const double force = ToSi(1.0, u, kDimForce), length = ToSi(1.0, u, kDimLength);
-                EXPECT_NEAR(
-                    1.0, si / (12.345 * std::pow(force, dim.force) * std::pow(length, dim.length)),
-                    1e-14)
-                    << f << ' ' << l;
-            }
-        }
-    }
-}
-
 // Values that a person enters have few digits: they come back as entered in every pair of units.
 TEST(Units, EnteredDigitsComeBack)
 {

@@ -2,9 +2,6 @@
 
 #include "modelstoresample.h"
 #include "qm_base/msgfunction.h"
-#include "qm_db/file/storefault.h"
-#include "qm_db/store/modelreader.h"
-#include "qm_db/store/sqlitedb.h"
 
 #include <cmath>
 #include <filesystem>
@@ -79,8 +76,6 @@ TEST_F(ModelStore, SavesOverTheFileThatItsResultsComeFrom)
     EXPECT_TRUE(Open(m_path).model.styp.title.ends_with("+++"));
 }
 
-// --- the writer's lock
-
 TEST_F(ModelStore, RefusesASecondEditorUntilTheFirstCloses)
 {
     Save(RichContent(), m_path);
@@ -98,76 +93,6 @@ TEST_F(ModelStore, RefusesASecondEditorUntilTheFirstCloses)
     EXPECT_EQ(0, second.Open(m_path, OPEN_MODE::Edit, other, m_error));
     first.Close();
     EXPECT_EQ(1, second.Open(m_path, OPEN_MODE::Edit, other, m_error)) << m_error.text;
-}
-
-// --- older versions
-
-/// Turns the file into the artificial version 0: no alpha_in_percent, titles without blanks.
-void MakeVersion0(const std::string& path)
-{
-    const CSqliteDb db = CSqliteDb::OpenForWriting(path);
-    db.Exec("ALTER TABLE evaluations DROP COLUMN alpha_in_percent;"
-            "UPDATE model SET title = 'old'; PRAGMA user_version = 0");
-    WriteChecksums(db);
-}
-
-constexpr T_MIGRATION kFrom0{0, [](const CSqliteDb& db) {
-                                 db.Exec(
-                                     "ALTER TABLE evaluations ADD COLUMN alpha_in_percent INTEGER;"
-                                     "UPDATE model SET title = title || ', from 0'");
-                             }};
-constexpr T_MIGRATION kFrom1{1, [](const CSqliteDb& db) {
-                                 db.Exec("ALTER TABLE storeys ADD COLUMN remark TEXT;"
-                                         "UPDATE model SET title = title || ', from 1'");
-                             }};
-
-std::string FaultOf(const std::string& path, const T_SCHEMA& schema)
-{
-    try {
-        (void)ReadModelFile(path, schema, CHECK_DEPTH::BySize);
-    } catch (const CStoreFault& fault) {
-        return fault.what();
-    }
-    return {};
-}
-
-TEST_F(ModelStore, WalksAnOlderFileUpStepByStep)
-{
-    T_MODEL_CONTENT expected = RichContent();
-    expected.model.evaluations.erase(2); // the one with the column that version 0 lacks
-    Save(expected, m_path);
-    MakeVersion0(m_path);
-    const std::string before = BytesOf(m_path);
-
-    const T_MIGRATION one[] = {kFrom0};
-    expected.model.styp.title = "old, from 0";
-    EXPECT_TRUE(SameContent(expected, ReadModelFile(m_path, {1, one}, CHECK_DEPTH::BySize)));
-
-    const T_MIGRATION both[] = {kFrom1, kFrom0};
-    expected.model.styp.title = "old, from 0, from 1";
-    const T_MODEL_CONTENT read = ReadModelFile(m_path, {2, both}, CHECK_DEPTH::BySize);
-    EXPECT_TRUE(SameContent(expected, read));
-    EXPECT_TRUE(before == BytesOf(m_path)); // in memory only
-
-    Save(read, m_path); // and a save writes the current version
-    EXPECT_TRUE(SameContent(expected, Open(m_path)));
-}
-
-TEST_F(ModelStore, RefusesAnOlderFileWithoutAWayUpOrWithDamage)
-{
-    Save(RichContent(), m_path);
-    MakeVersion0(m_path);
-    const T_MIGRATION gap[] = {kFrom1};
-    EXPECT_EQ("IDS_QM_DB_FILE_TOO_OLD", FaultOf(m_path, {2, gap}));
-    T_MODEL_CONTENT none;
-    EXPECT_EQ(0, CModelStore().Open(m_path, OPEN_MODE::ReadOnly, none, m_error));
-    EXPECT_EQ(FILE_FAULT::BadInput, m_error.fault);
-
-    const T_MIGRATION one[] = {kFrom0};
-    std::string bytes = BytesOf(m_path);
-    bytes[bytes.find("PY mode")] ^= 1;
-    WriteBytes(m_path, bytes);
-    EXPECT_EQ("IDS_QM_DB_FILE_DAMAGED", FaultOf(m_path, {1, one}));
 }
 
 } // namespace

@@ -1,11 +1,9 @@
 // Results of construction stages in the model file.
-#include "modelstoresample.h"
-#include "qm_base/textformat.h"
-#include "qm_db/casefile.h"
+#include "casetext.h"
+
 #include "qm_db/dbdoc.h"
 #include "qm_db/store/modelreader.h"
 #include "qm_db/store/sqlitedb.h"
-#include "qm_db/store/sqlitestmt.h"
 
 #include <algorithm>
 #include <cmath>
@@ -14,14 +12,9 @@
 
 namespace {
 
-const int kLoads[] = {kStageLoadSum, kStageLoadDead, kStageLoadErection, 1, 2, 3};
-
 T_MODEL_CONTENT Staged()
 {
-    T_MODEL_CONTENT c;
-    T_FILE_ERROR error;
-    EXPECT_EQ(1, CCaseFile::Read(QM_TEST_DATA "/cases/stage_all_members.json", c, error));
-    return c;
+    return ParseGood(CaseText("stage_all_members.json"));
 }
 
 /// A model of 1100 cantilevers, more than two blocks: node 2 i + 1 is held, element i is a beam to
@@ -102,45 +95,20 @@ std::vector<double> Everything(CDBDoc& doc, const T_STAGE_CHOICE& c)
     CPostCtrl& post = doc.Post();
     post.SelectStage(c.stage, c.step, c.load);
     std::vector<double> all;
-    const auto add = [&](int done, const T_DOF6& v) {
-        all.push_back(done ? 1 : -1);
+    const auto add = [&](auto read) {
+        T_DOF6 v{};
+        all.push_back(read(v) ? 1 : -1);
         all.insert(all.end(), v.begin(), v.end());
     };
     for (const auto& [id, node] : doc.Data().Model().nodes) {
-        T_DOF6 u{}, r{};
-        add(post.GetDspcNew(id, u), u);
-        add(post.GetReccNew(id, r), r);
+        add([&](T_DOF6& v) { return post.GetDspcNew(id, v); });
+        add([&](T_DOF6& v) { return post.GetReccNew(id, v); });
     }
     for (const auto& [id, element] : doc.Data().Model().elements) {
-        T_DOF6 f{};
-        add(post.GetStrtcNew(id, f[0]), f);
-        for (int position = 0; position < 5; ++position) {
-            T_DOF6 b{};
-            add(post.GetStrbcNew(id, position, b), b);
-        }
+        add([&](T_DOF6& v) { return post.GetStrtcNew(id, v[0]); });
+        for (int position = 0; position < 5; ++position)
+            add([&](T_DOF6& v) { return post.GetStrbcNew(id, position, v); });
     }
-    return all;
-}
-
-void ExpectSame(const std::vector<double>& a, const std::vector<double>& b, const std::string& what)
-{
-    ASSERT_EQ(a.size(), b.size()) << what;
-    double largest = 0.0;
-    for (const double v : a)
-        largest = std::max(largest, std::fabs(v));
-    for (std::size_t i = 0; i < a.size(); ++i) // sums are rounded in another order
-        ASSERT_NEAR(a[i], b[i], 1e-13 * largest) << what << ", value " << i;
-}
-
-/// Name, type, "not null" and place in the key of every column.
-std::vector<std::string> ColumnsOf(const CSqliteDb& db)
-{
-    std::vector<std::string> all;
-    CSqliteStmt rows(db, "SELECT m.name || ' ' || c.name || ' ' || c.type || ' ' || c.\"notnull\" "
-                         "|| ' ' || c.pk FROM sqlite_schema m, pragma_table_info(m.name) c "
-                         "ORDER BY 1");
-    while (rows.Step())
-        all.emplace_back(rows.Text(0));
     return all;
 }
 
@@ -154,27 +122,20 @@ TEST_F(StagedStore, GivesBackEveryChoiceAfterReopening)
         ASSERT_EQ(1, again.OpenModel(m_path, OPEN_MODE::ReadOnly, m_error)) << m_error.text;
         EXPECT_TRUE(again.IsPostMode());
         EXPECT_FALSE(again.Data().IsModified());
-        int choices = 0;
-        bool anything = false;
-        for (const auto& [key, stage] : m_doc.Data().Model().stages) {
-            for (int step = 1; step <= stage.steps; ++step) {
-                for (const int load : kLoads) {
-                    const std::vector<double> memory = Everything(m_doc, {key, step, load});
-                    ExpectSame(memory, Everything(again, {key, step, load}),
-                               stage.name + FormatText(", step %d, load %d", step, load));
-                    anything = anything || std::ranges::any_of(
-                                               memory, [](double v) { return std::fabs(v) > 1.0; });
-                    ++choices;
-                }
+        const auto cases = m_doc.Data().StagedResult()->Cases();
+        EXPECT_EQ(cases, again.Data().StagedResult()->Cases());
+        double largest = 0.0;
+        for (const auto& [at, group] : cases)
+            for (const int load : {at.load, kStageLoadSum, kStageLoadDead, kStageLoadErection}) {
+                SCOPED_TRACE(testing::Message() << at.stage << ' ' << at.step << ' ' << load);
+                const std::vector<double> a = Everything(m_doc, {at.stage, at.step, load}),
+                                          b = Everything(again, {at.stage, at.step, load});
+                ASSERT_EQ(a.size(), b.size());
+                largest = std::max(largest, *std::max_element(a.begin(), a.end()));
+                for (std::size_t i = 0; i < a.size(); ++i) // sums are rounded in another order
+                    ASSERT_NEAR(a[i], b[i], 1e-13 * largest) << "value " << i;
             }
-        }
-        EXPECT_EQ(6 * 6, choices);
-        EXPECT_TRUE(anything);
-        EXPECT_EQ(m_doc.Data().StagedResult()->Cases(), again.Data().StagedResult()->Cases());
-        again.Post().SelectStage(2, kStageLastStep, kStageLoadSum);
-        T_DOF6 v{};
-        EXPECT_EQ(0, again.Post().GetDspcNew(9, v));
-        EXPECT_EQ("Construction stage \"S2\" has no results of node 9.", again.Post().Error());
+        EXPECT_GT(largest, 1.0);
         ASSERT_EQ(1, again.SaveModelAs(m_folder.File("copy.qmdb"), m_error)) << m_error.text;
         m_path = m_folder.File("copy.qmdb");
         ASSERT_EQ(1, CModelStore::CheckWhole(m_path, m_error)) << m_error.text;
@@ -216,9 +177,6 @@ TEST_F(StagedStore, DamageIsRefusedWithItsPlace)
     std::vector<std::shared_ptr<IStaticResult>> terms;
     ASSERT_EQ(1, m_doc.Data().StagedResult()->Open({2, 3, 2}, terms));
     ASSERT_EQ(1, terms.at(0)->ReadAll(data));
-    Poke(data.displacement.at(2)[2]);
-    ExpectRefused("results of construction stage 2, step 3, load case 2, displacements, block 1");
-    WriteBytes(m_path, good);
     Poke(data.force.at(1)[2][4]);
     ExpectRefused("results of construction stage 2, step 3, load case 2, element forces, block 1");
 
@@ -250,90 +208,18 @@ TEST_F(StagedStore, DamageIsRefusedWithItsPlace)
     ExpectRefused("staged_results");
 }
 
-/// Over 16 MiB a block is checked when it is read, and only then.
-TEST_F(StagedStore, LargeFilesReadOnlyWhatIsAsked)
-{
-    T_MODEL_CONTENT content = Many();
-    content.model.stages.at(1).steps = 70;
-    Analyse(std::move(content));
-    ASSERT_GT(BytesOf(m_path).size(), std::size_t{16} << 20);
-    {
-        const CSqliteDb db = CSqliteDb::OpenForWriting(m_path);
-        db.Exec("UPDATE result_blocks SET checksum = checksum + 1 "
-                "WHERE part = 6 AND chunk = 1 AND step = 7");
-        WriteChecksums(db);
-    }
-    ASSERT_EQ(1, m_again.OpenModel(m_path, OPEN_MODE::ReadOnly, m_error)) << m_error.text;
-    CPostCtrl& post = m_again.Post();
-    T_DOF6 v{};
-    for (const int step : {6, 7, 8}) {
-        post.SelectStage(1, step, kStageLoadSum);
-        EXPECT_EQ(1, post.GetDspcNew(4, v)) << post.Error();
-        const int done = post.GetDspcNew(700, v); // of the second block
-        EXPECT_EQ(step != 7 ? 1 : 0, done) << step;
-        if (!done) {
-            EXPECT_NE(std::string::npos,
-                      post.Error().find("The results of construction stage \"up\" can't be read."));
-            EXPECT_NE(std::string::npos,
-                      post.Error().find("results of construction stage 1, step 7, load case 1, "
-                                        "displacements, block 2"))
-                << post.Error();
-        }
-        EXPECT_EQ(1, post.GetReccNew(699, v)) << post.Error();
-    }
-    // A save would lose them: it is refused, and the file stays.
-    const std::string before = BytesOf(m_path);
-    EXPECT_EQ(0, m_again.SaveModelAs(m_folder.File("copy.qmdb"), m_error));
-    EXPECT_NE(std::string::npos, m_error.text.find("step 7")) << m_error.text;
-    EXPECT_EQ(std::vector<std::string>{"m.qmdb"}, m_folder.Names());
-    EXPECT_TRUE(before == BytesOf(m_path));
-}
-
-TEST_F(StagedStore, AFileWithoutResultsSaysSo)
-{
-    m_doc.Data().Assign(Staged());
-    ASSERT_EQ(1, m_doc.SaveModelAs(m_path, m_error)) << m_error.text;
-    ASSERT_EQ(1, m_again.OpenModel(m_path, OPEN_MODE::ReadOnly, m_error)) << m_error.text;
-    EXPECT_EQ(nullptr, m_again.Data().StagedResult());
-    EXPECT_EQ(0, m_again.Post().CheckStagedResult());
-    EXPECT_EQ("The construction stages have no results: run the analysis.", m_again.Post().Error());
-}
-
 TEST_F(StagedStore, OldResultsStayRefusedAndComeBackWithTheModel)
 {
     Analyse(Staged());
-    ASSERT_EQ(1, m_doc.Edit().Begin("tension"));
-    ASSERT_EQ(1, m_doc.Edit().AddPtns(3, {3, 11.0}));
-    ASSERT_EQ(1, m_doc.Edit().Commit());
+    const auto pull = [](CDBDoc& doc, double kilonewtons) {
+        ASSERT_EQ(1, doc.Edit().Begin("tension"));
+        ASSERT_EQ(1, doc.Edit().AddPtns(3, {3, kilonewtons}));
+        ASSERT_EQ(1, doc.Edit().Commit());
+    };
+    pull(m_doc, 11.0);
     ASSERT_EQ(1, m_doc.SaveModel(m_error)) << m_error.text;
     ASSERT_EQ(1, m_again.OpenModel(m_path, OPEN_MODE::ReadOnly, m_error)) << m_error.text;
-    T_DOF6 v{7};
-    m_again.Post().SelectStage(1, 1, kStageLoadSum);
-    EXPECT_EQ(0, m_again.Post().GetDspcNew(2, v));
-    EXPECT_EQ(T_DOF6{7}, v);
-    EXPECT_EQ("The results of the construction stages are older than the model: run the analysis "
-              "again.",
-              m_again.Post().Error());
-    ASSERT_EQ(1, m_again.Edit().Begin("back"));
-    ASSERT_EQ(1, m_again.Edit().AddPtns(3, {3, 10.0}));
-    ASSERT_EQ(1, m_again.Edit().Commit());
-    EXPECT_EQ(1, m_again.Post().GetDspcNew(2, v)) << m_again.Post().Error();
-    EXPECT_LT(v[2], -0.001);
-}
-
-// The files were written by the program when it knew that version only.
-TEST_F(StagedStore, OlderFilesGetEveryColumnOfToday)
-{
-    ASSERT_EQ(1, CModelStore().Save(m_path, Staged(), m_error)) << m_error.text;
-    const std::vector<std::string> today = ColumnsOf(CSqliteDb::OpenReadOnly(m_path));
-    EXPECT_EQ(1, std::ranges::count(today, "model body TEXT 0 0"));
-    EXPECT_EQ(1, std::ranges::count(today, "staged_results load_group INTEGER 1 0"));
-    for (const int version : {1, 2, 3}) {
-        const CSqliteDb old =
-            CSqliteDb::OpenReadOnly(QM_TEST_DATA + FormatText("/model-v%d.qmdb", version));
-        EXPECT_NE(today, ColumnsOf(old)) << version;
-        const CSqliteDb copy = CSqliteDb::MemoryCopyOf(old);
-        Migrate(copy, version, CurrentSchema());
-        EXPECT_EQ(today, ColumnsOf(copy)) << version;
-    }
+    EXPECT_FALSE(m_again.IsPostMode());
+    pull(m_again, 10.0);
+    EXPECT_TRUE(m_again.IsPostMode());
 }
