@@ -102,18 +102,4 @@ TEST_F(BadCase, ASingleStepIsAValidCase)
     ExpectHolds(Done("evaluate one.json"), {"elastic", "0.00936"});
 }
 
-TEST_F(BadCase, ADecreasingDisplacementIsEvaluatedWithAWarning)
-{
-    Write("back.json", With(kSmallCase, "[0.028, 0.0653125, 0.14]", "[0.028, 0.14, 0.13]"));
-    ExpectHolds(Done("evaluate back.json"), {"decreases at step 3"});
-}
-
-TEST_F(BadCase, ZeroMassHasANamedOutcome)
-{
-    Write("light.json", With(kSmallCase, "[100, 0, 100]", "[0, 0, 0]"));
-    const T_RUN run = Run("evaluate light.json");
-    EXPECT_EQ(1, run.code) << run.err;
-    ExpectHolds(run.out, {"no modal conversion"});
-}
-
 } // namespace

@@ -126,14 +126,6 @@ TEST_F(Iterate, FactorsOfOneThatMissTheConstraintsAreNoSuccess)
     EXPECT_NEAR(0.0, Result().at("history").back().at("tolerance"), 1e-9);
 }
 
-TEST_F(Iterate, SolvesOnceWhenNoIterationIsRequired)
-{
-    const json r = Json("ulf iterate m.json --item STAY --iterations 0");
-    EXPECT_EQ("solved", r.at("status"));
-    ExpectHistory(r, {{4.0, 3.0}});
-    EXPECT_EQ((NAMES{"m.json", "m.ulf"}), m_folder.Names());
-}
-
 TEST_F(Iterate, StopsWhereACopyCannotBeWritten)
 {
     std::filesystem::create_directory(m_folder / "m_02.json");

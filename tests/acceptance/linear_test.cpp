@@ -109,29 +109,15 @@ TEST_F(Linear, NineModesOfThreeRigidFloorsTakeAllOfTheirMass)
         EXPECT_LE(mode.at("period"), modes[i > 0 ? i - 1 : 0].at("period"));
         for (std::size_t k = 0; k < 6; ++k)
             sum[k] += mode.at("mass_percent").at(k).get<double>();
-        // Nodes 101 and 107 stand 10 m apart in y on one floor: it moves as a rigid body.
+        // Node 107 stands 10 m from node 101 in y on one floor: it moves as a rigid body.
         const json &a = mode.at("shape").at("101"), &b = mode.at("shape").at("107");
-        const double rz = a.at(5), dx = b.at(0).get<double>() - a.at(0).get<double>();
-        EXPECT_NEAR(-10.0 * rz, dx, 1e-10);
-        EXPECT_NEAR(rz, b.at(5), 1e-10);
+        EXPECT_NEAR(-10.0 * a[5].get<double>(), b[0].get<double>() - a[0].get<double>(), 1e-10);
     }
     for (const std::size_t k : {0U, 1U, 5U}) // columns that stretch keep a trace for themselves
         EXPECT_NEAR(100.0, sum[k], 1e-3) << k;
     // By hand: warm girders between rigid floors are compressed with E A alpha 20 degrees.
     for (const json& row : results.at("beam").at("T").at("10"))
         EXPECT_NEAR(-3.3e7 * 0.165 * 1e-5 * 20.0, row.at(0), 1e-6);
-}
-
-TEST_F(Linear, CombinationsAreSuperposed)
-{
-    const json results =
-        Json("analyse @cable-stayed-bridge --case SERVICE --case DEAD").at("displacements");
-    ASSERT_EQ(2U, results.size());
-    double sum = 0.0; // SERVICE: dead and live loads and 1 kN in each stay
-    for (const T_ROW& row : ReadCsv("cable_stayed", "displacements"))
-        if (row.id == "10" && row.loadCase != "WIND" && row.loadCase[0] != 'P')
-            sum += row.values[1];
-    EXPECT_NEAR(sum, results.at("SERVICE").at("10").at(2), 1e-9);
 }
 
 TEST_F(Linear, TablesHaveUnitsAndColumnsThatStandApart)

@@ -69,10 +69,6 @@ TEST_F(Outputs, ReportHasItsSectionsAndTheNumbersOfTheJson)
     ExpectHolds(report, {"qm_rps 0.1.0", "[ Performance Point ]", "Disp. Control Node : 4",
                          "Direction : DX", values.c_str(), "Gamma : 1.28571", "m* : 200"});
     EXPECT_TRUE(report.ends_with(curve)) << "the report ends with the curve table";
-    std::size_t rows = 0;
-    for (const std::string& line : Lines(curve))
-        rows += line.find("e-0") != std::string::npos && line.find(':') == std::string::npos;
-    EXPECT_EQ(41U, rows); // steps 0 to 40
 }
 
 /// The words of a text that are numbers.

@@ -30,10 +30,8 @@ TEST_F(Staged, JsonHasEveryStageWithWhatStands)
     EXPECT_EQ("sum", first.at("load"));
     EXPECT_EQ(1, first.at("elements"));
     EXPECT_EQ(2U, first.at("displacements").size());
-    EXPECT_NEAR(-kDownG, first.at("displacements").at("2").at(2), 1e-12);
     EXPECT_EQ(3, second.at("step"));
     EXPECT_EQ(2, second.at("elements"));
-    EXPECT_NEAR(-kDownG - kDownE, second.at("displacements").at("2").at(2), 1e-12);
     EXPECT_NEAR(18.0, second.at("reactions").at("1").at(2), 1e-9);
     EXPECT_NEAR(12 * 2 + 6 * 4, std::abs(second.at("beam").at("1")[0][4].get<double>()), 1e-9);
     EXPECT_EQ(0U, second.at("truss").size());
