@@ -2,16 +2,14 @@
 #include "explorerpane.h"
 #include "pushovertools.h"
 #include "pushoverwindow.h"
+#include "tempfolder.h"
 
 #include "qm_rps/pushovercurvedampparamuser.h"
 #include "qm_ui/plot/plotwidget.h"
 
-#include <QCheckBox>
-#include <QComboBox>
-#include <QFile>
+#include <QAction>
 #include <QFileInfo>
 #include <QLabel>
-#include <QLineEdit>
 #include <QProcess>
 #include <QRegularExpression>
 #include <QSlider>
@@ -25,8 +23,7 @@ constexpr const char* kFrame = "rc-frame-3-storey";
 
 QByteArray Contents(const QString& path)
 {
-    QFile file(path);
-    return file.open(QIODevice::ReadOnly) ? file.readAll() : QByteArray();
+    return QByteArray::fromStdString(ReadText(path.toStdString()));
 }
 
 /// Runs the command line program; what it printed.
@@ -57,14 +54,10 @@ protected:
         Settle();
     }
     CPushOverCurveEdit& Model() { return m_window->Model(); }
-    QWidget* Field(const char* name)
-    {
-        CFormField* field = m_window->Form().Find(name);
-        return field ? field->widget : nullptr;
-    }
+    QWidget* Field(const char* name) { return m_window->Form().Find(name)->widget; }
+    const T_PUSH_EVALUATION& Result() { return Model().Shown().Result(); }
     bool IsMarked(const char* name) { return m_window->Form().Find(name)->IsMarked(); }
     CPlotWidget& Plot() { return *dynamic_cast<CPlotWidget*>(Field("plot")); }
-    QString Refusal() { return qobject_cast<QLabel*>(Field("refusal"))->text(); }
     bool HasLabel(const char* text)
     {
         return std::ranges::any_of(Plot().Plot().labels,
@@ -74,22 +67,13 @@ protected:
     CPushOverWindow* m_window = nullptr;
 };
 
-/// Clicks the field of a dialog's form.
-void ClickOn(CDialogWindow& dialog, const char* name)
-{
-    CFormField* field = dialog.Form().Find(name);
-    ASSERT_NE(nullptr, field) << name;
-    Click(field->widget);
-}
-
 /// Saves from the preview and closes it.
 CAnswers::STEP SaveText()
 {
     return [](QWidget& window) {
-        auto* dialog = dynamic_cast<CDialogWindow*>(&window);
-        ASSERT_NE(nullptr, dialog);
-        ClickOn(*dialog, "save");
-        dialog->reject();
+        auto& dialog = dynamic_cast<CDialogWindow&>(window);
+        Click(desktop_test::Field(dialog, "save"));
+        dialog.reject();
     };
 }
 
@@ -116,7 +100,7 @@ TEST_F(PushoverWindows, TheWholeJobGivesTheReportOfTheCommandLine)
         const auto it = std::ranges::find(names, job.stored);
         ASSERT_NE(names.end(), it);
         ChooseIndex(Field("open"), static_cast<int>(it - names.begin()) + 1);
-        ASSERT_EQ(job.stored, Model().Shown().Result().eval.name);
+        ASSERT_EQ(job.stored, Result().eval.name);
         ChooseIndex(Field("spectrum"), job.spectrum);
         AnswerFileName(File("window")); // .txt is appended
         {
@@ -128,7 +112,7 @@ TEST_F(PushoverWindows, TheWholeJobGivesTheReportOfTheCommandLine)
         const QByteArray report = Contents(File("window.txt"));
         EXPECT_GT(report.size(), 1000) << job.same;
         EXPECT_EQ(Contents(File("program.txt")), report) << job.same;
-        const T_PUSH_EVALUATION& e = Model().Shown().Result();
+        const T_PUSH_EVALUATION& e = Result();
         EXPECT_EQ(NumberAfter(json, "\"factors\"", "gamma"), e.factors.gamma);
         if (e.IsTarget()) {
             EXPECT_EQ(NumberAfter(json, "\"limit_states\"", "demand"), e.limitStates[0].demand);
@@ -145,25 +129,22 @@ TEST_F(PushoverWindows, TheWholeJobGivesTheReportOfTheCommandLine)
 TEST_F(PushoverWindows, TypingIsEvaluatedAtOnceAndWrongInputKeepsTheLastPicture)
 {
     OpenCurve();
-    const double first = Model().Shown().Result().point->Sd;
+    const double first = Result().point->Sd;
     Type(Field("elasticDamping"), "8");
-    const double softer = Model().Shown().Result().point->Sd;
+    const double softer = Result().point->Sd;
     EXPECT_LT(softer, first);
     EXPECT_EQ("", Model().Shown().Refusal());
     const T_PLOT before = Plot().Plot();
-    for (const char* wrong : {"-1", "101", "x", ""}) {
+    for (const char* wrong : {"x", "101"}) {
         Type(Field("elasticDamping"), wrong);
         EXPECT_TRUE(IsMarked("elasticDamping")) << wrong;
         EXPECT_EQ(before, Plot().Plot()) << wrong;
-        EXPECT_EQ(softer, Model().Shown().Result().point->Sd) << wrong;
+        EXPECT_EQ(softer, Result().point->Sd) << wrong;
     }
-    Type(Field("elasticDamping"), "-1");
-    EXPECT_TRUE(Field("refusal")->isVisible());
-    EXPECT_TRUE(Refusal().contains("0 to 100"));
+    EXPECT_TRUE(qobject_cast<QLabel*>(Field("refusal"))->text().contains("0 to 100"));
     Type(Field("elasticDamping"), "5");
-    EXPECT_EQ(first, Model().Shown().Result().point->Sd);
+    EXPECT_EQ(first, Result().point->Sd);
     EXPECT_FALSE(Field("refusal")->isVisible());
-    EXPECT_FALSE(IsMarked("elasticDamping"));
 }
 
 TEST_F(PushoverWindows, TrialsAreSteppedThroughOneAtATime)
@@ -174,18 +155,17 @@ TEST_F(PushoverWindows, TrialsAreSteppedThroughOneAtATime)
     auto* slider = Field("trial")->findChild<QSlider*>();
     ASSERT_EQ(count, slider->maximum());
     Plot().SetView({T_PLOT_RANGE{0.0, 5.0}, {}, {}}); // the person has zoomed in
+    auto* table = qobject_cast<QTableView*>(Field("trials"));
     for (int k = 1; k <= count; ++k) {
         Key(slider, Qt::Key_Right);
         EXPECT_EQ(k, Model().Shown().Trial());
         EXPECT_TRUE(HasLabel(("trial " + std::to_string(k)).c_str()));
         EXPECT_EQ(5.0, Plot().View().x->hi);
-        auto* table = qobject_cast<QTableView*>(Field("trials"));
         EXPECT_EQ(k - 1, table->currentIndex().row());
     }
     Key(Field("trial")->findChild<QSpinBox*>(), Qt::Key_Down);
     EXPECT_EQ(count - 1, Model().Shown().Trial());
-    auto* table = qobject_cast<QTableView*>(Field("trials"));
-    const double dpi = Model().Shown().Result().trace[0].dpi;
+    const double dpi = Result().trace[0].dpi;
     EXPECT_NEAR(dpi, table->model()->index(0, 0).data().toDouble(), 1e-5 * dpi);
 }
 
@@ -197,79 +177,55 @@ TEST_F(PushoverWindows, EveryMethodAndPlotTypeHasItsPicture)
     EXPECT_EQ(PUSH_METHOD::Ec8Opcm, Model().m_settings.method);
     EXPECT_FALSE(Field("procedure")->isVisibleTo(m_window));
     EXPECT_TRUE(Field("masonry")->isVisibleTo(m_window));
-    const auto lines = Plot().Plot().guides.size();
+    EXPECT_FALSE(Plot().Plot().guides.empty());
     Click(Field("guideLines"));
-    EXPECT_GT(lines, 2U);
     EXPECT_TRUE(Plot().Plot().guides.empty());
     const char* const titles[] = {"Resultant Base Reaction (kips)", "Shear Coefficient",
                                   "Shear Coefficient", "Load Factor"};
     for (int type = 0; type < 4; ++type) {
         ChooseIndex(Field("plotType"), type);
         EXPECT_EQ(titles[type], Plot().Plot().y.title);
-        EXPECT_EQ(Model().Shown().Result().curve.x, Plot().Plot().series.at(0).x);
+        EXPECT_EQ(Result().curve.x, Plot().Plot().series.at(0).x);
     }
-    ChooseIndex(Field("method"), 1);
-    EXPECT_TRUE(Field("procedure")->isVisibleTo(m_window));
-    ASSERT_EQ(2, qobject_cast<QComboBox*>(Field("procedure"))->count());
 }
 
-TEST_F(PushoverWindows, PicturesAreExportedInEveryFormatAndBadNamesAreRefused)
+TEST_F(PushoverWindows, PictureAndCurveAreWrittenAndBadNamesAreRefused)
 {
     OpenCurve();
-    for (const char* name : {"a.svg", "a.pdf", "a.png", "a.jpg", "a.bmp"}) {
-        AnswerFileName(File(name));
-        Click(Field("picture"));
-        EXPECT_GT(QFileInfo(File(name)).size(), 1000) << name;
-    }
-    for (const QString& bad : {File("a.gif"), File("no folder/a.svg")}) {
-        AnswerFileName(bad);
-        CAnswers answers({CAnswers::Accept()});
-        Click(Field("picture"));
-        EXPECT_TRUE(answers.m_texts.value(0).contains(bad)) << bad.toStdString();
-    }
+    AnswerFileName(File("a.png"));
+    Click(Field("picture"));
+    EXPECT_GT(QFileInfo(File("a.png")).size(), 1000);
     AnswerFileName(File("curve.txt"));
-    {
-        CAnswers answers({SaveText()});
-        Click(Field("curveFile"));
-    }
+    CAnswers answers({SaveText(), CAnswers::Accept(), SaveText(), CAnswers::Accept()});
+    Click(Field("curveFile"));
     EXPECT_TRUE(Contents(File("curve.txt")).contains("step"));
     EXPECT_FALSE(Contents(File("curve.txt")).contains("Performance Point"));
+    AnswerFileName(File("a.gif"));
+    Click(Field("picture"));
     AnswerFileName(File("no folder/report"));
-    CAnswers answers({[](QWidget& window) {
-                          ClickOn(dynamic_cast<CDialogWindow&>(window), "save");
-                          dynamic_cast<CDialogWindow&>(window).reject();
-                      },
-                      CAnswers::Accept()});
     Click(Field("report"));
-    EXPECT_TRUE(answers.m_texts.value(0).contains("can't be created"));
+    EXPECT_TRUE(answers.m_texts.value(0).contains("a.gif"));
+    EXPECT_TRUE(answers.m_texts.value(1).contains("can't be created"));
 }
 
-TEST_F(PushoverWindows, UserDampingIsAcceptedRefusedAndCancelled)
+TEST_F(PushoverWindows, UserDampingIsRefusedAndAccepted)
 {
     OpenCurve();
     ChooseIndex(Field("behavior"), 3);
     const auto fill = [](const char* beta1, const char* beta2) {
         return [=](CDialogWindow& dialog) {
-            Type(dialog.Form().Find("beta1")->widget, beta1);
-            Type(dialog.Form().Find("beta2")->widget, beta2);
+            Enter(dialog, "beta1", beta1);
+            Enter(dialog, "beta2", beta2);
         };
     };
-    {
-        CAnswers answers({CAnswers::Fill(fill("10", "30"), false), CAnswers::Reject()});
-        Click(Field("userDamping"));
-        EXPECT_EQ(std::nullopt, Model().m_settings.userDamping);
-    }
-    {
-        CAnswers answers({CAnswers::Fill(fill("30", "10")), CAnswers::Accept(), // the message
-                          CAnswers::Fill(fill("10", "30"))});
-        Click(Field("userDamping"));
-        EXPECT_TRUE(answers.m_texts.value(0).contains("beta1"));
-    }
-    ASSERT_TRUE(Model().m_settings.userDamping);
-    EXPECT_EQ(10.0, (*Model().m_settings.userDamping)[0]);
-    EXPECT_EQ(30.0, (*Model().m_settings.userDamping)[2]);
+    CAnswers answers({CAnswers::Fill(fill("30", "10")), CAnswers::Accept(), // the message
+                      CAnswers::Fill(fill("10", "30"))});
+    Click(Field("userDamping"));
+    EXPECT_TRUE(answers.m_texts.value(0).contains("beta1"));
+    EXPECT_EQ(10.0, Model().m_settings.userDamping.value()[0]);
+    EXPECT_EQ(30.0, Model().m_settings.userDamping.value()[2]);
     EXPECT_EQ(Model().m_settings.userDamping,
-              Model().Shown().Result().eval.userDamping); // evaluated with them
+              Result().eval.userDamping); // evaluated with them
 }
 
 TEST_F(PushoverWindows, StoredEvaluationsAndStepsAreVisibleActions)
@@ -302,7 +258,7 @@ TEST_F(PushoverWindows, AdditionalStepsAndPointsAreListedAndDrawn)
         Type(Field("addStepNumber"), step);
         Click(Field("addStep"));
     }
-    EXPECT_EQ(2U, Model().Shown().Result().additionalSteps.size());
+    EXPECT_EQ(2U, Result().additionalSteps.size());
     EXPECT_TRUE(HasLabel("step 40"));
     Type(Field("addStepNumber"), "100000");
     {
@@ -312,12 +268,11 @@ TEST_F(PushoverWindows, AdditionalStepsAndPointsAreListedAndDrawn)
     }
     ChooseIndex(Field("addPointSpectrum"), 1);
     Click(Field("addPoint"));
-    EXPECT_EQ(1U, Model().Shown().Result().additionalPoints.size());
-    EXPECT_TRUE(HasLabel("ATC strong") || !Model().Shown().Result().additionalPoints[0].point);
+    EXPECT_EQ(1U, Result().additionalPoints.size());
     qobject_cast<QTableView*>(Field("steps"))->selectRow(0);
     Click(Field("removeStep"));
-    ASSERT_EQ(1U, Model().Shown().Result().additionalSteps.size());
-    EXPECT_EQ(40, Model().Shown().Result().additionalSteps[0].step);
+    ASSERT_EQ(1U, Result().additionalSteps.size());
+    EXPECT_EQ(40, Result().additionalSteps[0].step);
 }
 
 TEST_F(PushoverWindows, TheComparisonShowsEveryMethodAndIsExported)
@@ -325,12 +280,13 @@ TEST_F(PushoverWindows, TheComparisonShowsEveryMethodAndIsExported)
     ASSERT_TRUE(Open(kFrame));
     AnswerFileName(File("all.svg"));
     const auto look = [](CDialogWindow& dialog) {
-        auto* table = qobject_cast<QTableView*>(dialog.Form().Find("table")->widget);
-        EXPECT_EQ(8, table->model()->rowCount());
-        const QString first = table->model()->index(7, 1).data().toString();
-        ChooseIndex(dialog.Form().Find("spectrum")->widget, 3);
-        EXPECT_NE(first, table->model()->index(7, 1).data().toString());
-        ClickOn(dialog, "picture");
+        QAbstractItemModel& table =
+            *qobject_cast<QTableView*>(desktop_test::Field(dialog, "table"))->model();
+        EXPECT_EQ(8, table.rowCount());
+        const QString first = Cell(table, 7, 1);
+        ChooseIndex(desktop_test::Field(dialog, "spectrum"), 3);
+        EXPECT_NE(first, Cell(table, 7, 1));
+        Click(desktop_test::Field(dialog, "picture"));
         dialog.reject();
     };
     CAnswers answers({CAnswers::Fill(look, false)});
@@ -345,21 +301,15 @@ TEST_F(PushoverWindows, OneWindowFollowsTheDocumentAndTheLanguage)
     ASSERT_TRUE(OpenPushoverRecord(m_main->Desktop(), EXPLORER_TABLE::Evaluations, 6));
     m_window = &CPushOverWindow::Show(m_main->Desktop());
     EXPECT_EQ(m_window, &CPushOverWindow::Show(m_main->Desktop()));
-    EXPECT_EQ("PX_MODE1 EC8", Model().Shown().Result().eval.name);
+    EXPECT_EQ("PX_MODE1 EC8", Result().eval.name);
     Run("IDS_QM_UI_ITALIAN");
+    EXPECT_EQ("&Salva", m_main->Action("IDS_QM_UI_SAVE")->text());
     EXPECT_EQ("Curva pushover", m_window->windowTitle());
     EXPECT_TRUE(QString::fromStdString(Plot().Plot().x.title).startsWith("Spostamento spettrale"));
     Run("IDS_QM_UI_ENGLISH");
     ASSERT_TRUE(Open("first-steps"));
     (void)CPushOverWindow::Show(m_main->Desktop());
     const auto& pushes = m_main->Doc().Data().Model().pushovers;
-    EXPECT_EQ(pushes.begin()->second.name, Model().Shown().Result().loadCase.name);
+    EXPECT_EQ(pushes.begin()->second.name, Result().loadCase.name);
     EXPECT_FALSE(OpenPushoverRecord(m_main->Desktop(), EXPLORER_TABLE::Nodes, 1));
-    // Enter takes a value and closes nothing.
-    auto* damping = qobject_cast<QLineEdit*>(Field("elasticDamping"));
-    damping->selectAll();
-    Key(damping, 0, "7");
-    Key(damping, Qt::Key_Return);
-    EXPECT_TRUE(m_window->isVisible());
-    EXPECT_EQ(7.0, Model().m_settings.elasticDamping);
 }

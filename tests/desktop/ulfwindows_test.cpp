@@ -19,8 +19,6 @@ constexpr const char* kSettings = "Settings of the iterative analysis";
 
 } // namespace
 
-// ---- calculation --------------------------------------------------------------------------------
-
 TEST_F(UlfWindows, ATunedBeamIsSolvedExportedAndCombined)
 {
     ASSERT_TRUE(Open("tuned-beam"));
@@ -30,33 +28,26 @@ TEST_F(UlfWindows, ATunedBeamIsSolvedExportedAndCombined)
         const double byHand[] = {1.0, 43 / 38.0, 37 / 38.0, 37 / 38.0, 43 / 38.0};
         for (int row = 0; row < 5; ++row)
             EXPECT_NEAR(byHand[row], Cell(Table(w), row, 1).toDouble(), 1e-8) << row;
-        EXPECT_EQ("D2", Cell(Table(w, 1), 0, 0));
         EXPECT_EQ("at its bound", Cell(Table(w, 1), 0, 5));
         EXPECT_TRUE(Table(w, 1).index(0, 0).data(Qt::BackgroundRole).isValid());
-        EXPECT_EQ("m", Cell(Table(w, 1), 0, 6));
         EXPECT_FALSE(Picture(w).series.empty());
         AnswerFileName(File("props.xlsx"));
         Press("IDS_QM_UI_ULF_SHEET_WRITE")(w);
         EXPECT_GT(QFileInfo(File("props.xlsx")).size(), 3000);
-        Press("IDS_QM_UI_ULF_MAKE_COMBINATION")(w); // without a name
-        EXPECT_TRUE(Says(w, "no name"));
-        Type(&Widget(w, "combination"), "ALL"); // taken
+        Type(Field(w, "combination"), "ALL"); // taken
         Press("IDS_QM_UI_ULF_MAKE_COMBINATION")(w);
         EXPECT_TRUE(Says(w, "exists already"));
         EXPECT_EQ(before, Model().combinations.size());
-        Type(&Widget(w, "combination"), "LEVEL");
+        Type(Field(w, "combination"), "LEVEL");
         Press("IDS_QM_UI_ULF_MAKE_COMBINATION")(w);
         EXPECT_TRUE(Says(w, "was added"));
         w.reject();
     };
-    CPlay play({{kItems,
-                 [](CDialogWindow& w) {
-                     EXPECT_EQ("PROPS", Cell(Table(w), 0, 0));
-                     ChooseRow(w, 0);
-                     Press("IDS_QM_UI_ULF_SOLVE")(w);
-                 }},
-                {kResult, readResult},
-                {kItems, Cancel}});
+    const ACT solve = [](CDialogWindow& w) {
+        ChooseRow(w, 0);
+        Press("IDS_QM_UI_ULF_SOLVE")(w);
+    };
+    CPlay play({{kItems, solve}, {kResult, readResult}, {kItems, Cancel}});
     Run("IDS_QM_UI_ULF_ITEMS");
     ASSERT_EQ(before + 1, Model().combinations.size());
     const T_LCOM_D& made = Model().combinations.rbegin()->second;
@@ -66,40 +57,22 @@ TEST_F(UlfWindows, ATunedBeamIsSolvedExportedAndCombined)
     EXPECT_EQ(before, Model().combinations.size());
 }
 
-TEST_F(UlfWindows, ASheetThatCantBeWrittenSaysSo)
-{
-    ASSERT_TRUE(Open("tuned-beam"));
-    CPlay play({{kItem, Press("IDS_QM_UI_ULF_SOLVE")},
-                {kResult,
-                 [&](CDialogWindow& w) {
-                     AnswerFileName(File("no-such-folder/props.xlsx"));
-                     Press("IDS_QM_UI_ULF_SHEET_WRITE")(w);
-                     w.reject();
-                 }},
-                {kItem, Cancel}});
-    OpenRecord(EXPLORER_TABLE::UlfItems, 1);
-    ASSERT_EQ(1, play.m_texts.size());
-    EXPECT_TRUE(play.m_texts[0].contains("no-such-folder"));
-}
-
 TEST_F(UlfWindows, AnItemWithoutASolutionIsExplained)
 {
     ASSERT_TRUE(Open("tuned-beam"));
+    const ACT read = [](CDialogWindow& w) {
+        EXPECT_TRUE(Says(w, "D2 (= 0 m), D3 (= 0 m), D4 (= 0 m), D5 (= 0 m), M3"));
+        w.reject();
+    };
     CPlay play({{kItem, Press("IDS_QM_UI_ULF_SOLVE")}, // refused with a message
                 {kItem, Press("IDS_QM_UI_ULF_EXPLAIN")},
-                {"Explanation of load factors",
-                 [](CDialogWindow& w) {
-                     EXPECT_TRUE(Says(w, "D2 (= 0 m), D3 (= 0 m), D4 (= 0 m), D5 (= 0 m), M3"));
-                     w.reject();
-                 }},
+                {"Explanation of load factors", read},
                 {kItem, Cancel}});
     OpenRecord(EXPLORER_TABLE::UlfItems, 4);
     ASSERT_EQ(1, play.m_texts.size()) << play.m_texts.join('|').toStdString();
     EXPECT_TRUE(play.m_texts[0].contains("IMPOSSIBLE"));
     EXPECT_FALSE(m_main->Doc().Undo().CanUndo());
 }
-
-// ---- editing ------------------------------------------------------------------------------------
 
 TEST_F(UlfWindows, AnItemIsRefusedWithItsFieldMarkedThenStoredAsOneStep)
 {
@@ -108,85 +81,69 @@ TEST_F(UlfWindows, AnItemIsRefusedWithItsFieldMarkedThenStoredAsOneStep)
     const ACT spoil = [](CDialogWindow& w) {
         for (int row = 1; row <= 4; ++row)
             EXPECT_TRUE(SetCell(Table(w), row, 1, Qt::Unchecked));
-        EXPECT_FALSE(SetCell(Table(w), 1, 4, "heavy"));
         w.accept();
         EXPECT_TRUE(w.isVisible());
-        EXPECT_TRUE(w.Form().Find("unknowns")->IsMarked());
+        EXPECT_TRUE(IsMarked(w, "unknowns"));
     };
     const ACT repair = [](CDialogWindow& w) {
         EXPECT_TRUE(SetCell(Table(w), 2, 1, Qt::Checked));
         EXPECT_TRUE(SetCell(Table(w), 2, 4, "2.5"));
         EXPECT_TRUE(SetCell(Table(w, 1), 1, 0, Qt::Unchecked)); // D3
-        Type(&Widget(w, "name"), "ONE PROP");
-        ChooseIndex(&Widget(w, "objective"), 2);
+        Type(Field(w, "name"), "ONE PROP");
+        ChooseIndex(Field(w, "objective"), 2);
         w.accept();
     };
-    {
-        CPlay play({{kItem, spoil}, {kItem, Cancel}});
-        OpenRecord(EXPLORER_TABLE::UlfItems, 1);
-        EXPECT_TRUE(play.m_texts.value(0).contains("No load case is marked unknown"));
-        EXPECT_EQ(before, Model().ulfItems.at(1));
-        EXPECT_FALSE(m_main->Doc().Data().IsModified());
-    }
     CPlay play({{kItem, spoil}, {kItem, repair}});
     OpenRecord(EXPLORER_TABLE::UlfItems, 1);
+    EXPECT_TRUE(play.m_texts.value(0).contains("No load case is marked unknown"));
     const T_ULFI_D& stored = Model().ulfItems.at(1);
     EXPECT_EQ("ONE PROP", stored.name);
-    ASSERT_EQ(1U, stored.unknowns.size());
-    EXPECT_EQ(2.5, stored.unknowns[0].weight);
+    EXPECT_EQ(1U, stored.unknowns.size());
+    EXPECT_EQ(2.5, stored.unknowns.at(0).weight);
     EXPECT_EQ(2, stored.objective);
     EXPECT_EQ((std::vector<std::string>{"D2", "D4", "D5"}), stored.constraints);
     Run("IDS_QM_UI_UNDO");
     EXPECT_EQ(before, Model().ulfItems.at(1));
 }
 
-TEST_F(UlfWindows, ConstraintsAreAddedChangedAndDeletedFromTheirList)
+TEST_F(UlfWindows, ConstraintsAreAddedAndDeletedInTheirList)
 {
     ASSERT_TRUE(Open("tuned-beam"));
     const ACT fill = [](CDialogWindow& w) {
-        Type(&Widget(w, "name"), "D2"); // taken
-        ChooseIndex(&Widget(w, "type"), 3);
-        Type(&Widget(w, "id"), "99"); // no such beam
-        ChooseIndex(&Widget(w, "component"), 4);
-        ChooseIndex(&Widget(w, "position"), 2);
+        Type(Field(w, "name"), "D2"); // taken
+        ChooseIndex(Field(w, "type"), 3);
+        Type(Field(w, "id"), "99"); // no such beam
+        ChooseIndex(Field(w, "component"), 4);
+        ChooseIndex(Field(w, "position"), 2);
         w.accept();
-        EXPECT_TRUE(w.isVisible());
         EXPECT_EQ(2, w.Form().Marks());
     };
     const ACT repair = [](CDialogWindow& w) {
-        Type(&Widget(w, "id"), "2.5");
-        w.accept(); // what can't be read has the focus
-        EXPECT_EQ(w.focusWidget(), &Widget(w, "id"));
-        Type(&Widget(w, "id"), "2");
-        Type(&Widget(w, "name"), "M2 half");
+        Type(Field(w, "id"), "2");
+        Type(Field(w, "name"), "M2 half");
         EXPECT_EQ(0, w.Form().Marks());
-        ASSERT_TRUE(Widget(w, "value").isEnabled());
-        Type(&Widget(w, "value"), "12.5");
+        Enter(w, "value", "12.5");
         w.accept();
     };
-    CPlay play({{"Load factor constraints", Press("IDS_QM_UI_ULF_ADD")},
+    const ACT remove = [](CDialogWindow& w) {
+        EXPECT_TRUE(Cell(Table(w), 13, 1).contains("Moment y of beam 2"));
+        ChooseRow(w, 0); // used by items
+        Press("IDS_QM_UI_ULF_DELETE")(w);
+        ChooseRow(w, 13);
+        Press("IDS_QM_UI_ULF_DELETE")(w);
+        EXPECT_EQ(13, Table(w).rowCount());
+        w.reject();
+    };
+    constexpr const char* kList = "Load factor constraints";
+    CPlay play({{kList, Press("IDS_QM_UI_ULF_ADD")},
                 {kConstraint, fill},
                 {kConstraint, repair},
-                {"Load factor constraints",
-                 [](CDialogWindow& w) {
-                     EXPECT_TRUE(Cell(Table(w), 13, 1).contains("Moment y of beam 2"));
-                     ChooseRow(w, 0); // used by items
-                     Press("IDS_QM_UI_ULF_DELETE")(w);
-                     ChooseRow(w, 13);
-                     Press("IDS_QM_UI_ULF_MODIFY")(w);
-                 }},
-                {kConstraint, Cancel},
-                {"Load factor constraints", [](CDialogWindow& w) {
-                     Press("IDS_QM_UI_ULF_DELETE")(w);
-                     EXPECT_EQ(13, Table(w).rowCount());
-                     w.reject();
-                 }}});
+                {kList, remove}});
     Run("IDS_QM_UI_ULF_CONSTRAINTS");
     EXPECT_TRUE(play.m_texts.value(0).contains("another constraint has this name"));
     EXPECT_TRUE(play.m_texts.value(1).contains("PROPS")); // those that use D2
     Run("IDS_QM_UI_UNDO");
     const T_ULFC_D& made = Model().ulfConstraints.rbegin()->second;
-    EXPECT_EQ("M2 half", made.name);
     EXPECT_EQ(ULFC_TYPE::Beam, made.type);
     EXPECT_EQ(2, made.position);
     EXPECT_EQ(4, made.component);
@@ -202,10 +159,8 @@ TEST_F(UlfWindows, RowsOfAStageItemAreAddedJudgedAndDeleted)
         Press("IDS_QM_UI_ULF_ADD_ROW")(w);
         ASSERT_EQ(4, rows.rowCount());
         EXPECT_TRUE(SetCell(rows, 3, 0, "piece 1/First Step"));
-        EXPECT_FALSE(SetCell(rows, 3, 0, "piece 9/First Step"));
         EXPECT_TRUE(SetCell(rows, 3, 1, "T1")); // stands there already
         w.accept();
-        EXPECT_TRUE(w.isVisible());
         EXPECT_TRUE(rows.index(3, 1).data(Qt::ToolTipRole).toString().contains("row 4"));
         EXPECT_TRUE(SetCell(rows, 3, 1, "G1"));
         EXPECT_TRUE(SetCell(rows, 3, 4, "0.25"));
@@ -240,11 +195,9 @@ TEST_F(UlfWindows, ACombinationTakesCasesAndOthersButNotItself)
     const T_LCOM_D before = Model().combinations.at(1);
     const ACT edit = [](CDialogWindow& w) {
         EXPECT_TRUE(SetCell(Table(w), 0, 1, "1.35"));
-        EXPECT_FALSE(SetCell(Table(w), 0, 1, "1,35"));
         Press("IDS_QM_UI_ULF_ADD_ROW")(w);
         EXPECT_TRUE(SetCell(Table(w), 5, 0, "OUTER (combination)")); // which contains this one
         w.accept();
-        EXPECT_TRUE(w.isVisible());
         ChooseRow(w, 5);
         Press("IDS_QM_UI_ULF_DELETE_ROW")(w);
         EXPECT_TRUE(Says(w, "1.35 W"));
@@ -267,7 +220,6 @@ TEST_F(UlfWindows, SettingsOfTheIterationAreJudgedAndKept)
         Key(spin, Qt::Key_Up);
         Type(tolerance, "-1");
         w.accept();
-        EXPECT_TRUE(w.isVisible());
         Type(tolerance, "0.02");
         w.accept();
     };

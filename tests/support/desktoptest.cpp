@@ -16,6 +16,7 @@
 #include <QPushButton>
 #include <QSettings>
 #include <QStandardPaths>
+#include <QTabWidget>
 #include <QTimer>
 
 #include <clocale>
@@ -71,6 +72,61 @@ void ChooseIndex(QWidget* box, int index)
     ASSERT_NE(nullptr, list);
     for (int i = list->currentIndex(); i != index; i += i < index ? 1 : -1)
         Key(list, i < index ? Qt::Key_Down : Qt::Key_Up);
+}
+
+QWidget* Field(CDialogWindow& window, const std::string& name)
+{
+    CFormField* field = window.Form().Find(name);
+    EXPECT_NE(nullptr, field) << name;
+    if (!field) return nullptr;
+    for (QWidget* page = field->widget; page; page = page->parentWidget())
+        if (QWidget* stack = page->parentWidget())
+            if (auto* tabs = qobject_cast<QTabWidget*>(stack->parentWidget()))
+                tabs->setCurrentWidget(page);
+    return field->widget;
+}
+
+CGridView& Grid(CDialogWindow& window, const std::string& name)
+{
+    return dynamic_cast<CGridView&>(*Field(window, name));
+}
+
+bool IsMarked(CDialogWindow& window, const std::string& name)
+{
+    const CFormField* field = window.Form().Find(name);
+    return field && field->IsMarked();
+}
+
+QString TextAt(CDialogWindow& window, const std::string& name)
+{
+    auto* edit = qobject_cast<QLineEdit*>(Field(window, name));
+    return edit ? edit->text() : QString();
+}
+
+void Enter(CDialogWindow& window, const std::string& name, const QString& text)
+{
+    QWidget* field = Field(window, name);
+    ASSERT_TRUE(field && field->isEnabled()) << name;
+    QApplication::setActiveWindow(&window); // also after a message
+    Type(field, text);
+}
+
+void Push(CDialogWindow& window, const std::string& name)
+{
+    QWidget* button = Field(window, name);
+    ASSERT_TRUE(button && button->isEnabled()) << name;
+    Key(button, Qt::Key_Space);
+}
+
+QString Cell(QAbstractItemModel& table, int row, int column)
+{
+    return table.index(row, column).data().toString();
+}
+
+bool SetCell(QAbstractItemModel& table, int row, int column, const QVariant& value)
+{
+    const bool flag = table.index(row, column).data(Qt::CheckStateRole).isValid();
+    return table.setData(table.index(row, column), value, flag ? Qt::CheckStateRole : Qt::EditRole);
 }
 
 CAnswers::CAnswers(std::vector<STEP> steps) : m_steps(std::move(steps)), m_timer(new QTimer(this))

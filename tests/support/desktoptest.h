@@ -31,6 +31,18 @@ void Click(QWidget* widget);
 /// Chooses an entry of a list of choices, as by the keyboard.
 void ChooseIndex(QWidget* box, int index);
 
+/// The widget of a field, its page in front; the table of one; whether a rule marks it.
+QWidget* Field(CDialogWindow& window, const std::string& name);
+CGridView& Grid(CDialogWindow& window, const std::string& name);
+bool IsMarked(CDialogWindow& window, const std::string& name);
+QString TextAt(CDialogWindow& window, const std::string& name);
+/// Types over a field that is open; presses a button or turns a check box by the keyboard.
+void Enter(CDialogWindow& window, const std::string& name, const QString& text);
+void Push(CDialogWindow& window, const std::string& name);
+/// What a table shows; takes a value as typed, a flag as its check state.
+QString Cell(QAbstractItemModel& table, int row, int column);
+bool SetCell(QAbstractItemModel& table, int row, int column, const QVariant& value);
+
 /// Answers the boxes and dialogs that come up while it lives, one step after the other; each step
 /// gets the modal window. A window without a step left is closed and fails the test.
 class CAnswers : public QObject {
@@ -63,6 +75,7 @@ protected:
     DesktopTest();
     ~DesktopTest() override;
     int Open(const char* example) { return m_main->Open(Example(example)); }
+    const T_MODEL& Model() { return m_main->Doc().Data().Model(); }
     /// Runs a command by its key, as its menu entry does.
     void Run(const char* key);
     QString File(const char* name) const { return m_folder + "/" + name; }

@@ -8,7 +8,6 @@ namespace desktop_test {
 
 class UlfWindows : public DesktopTest {
 protected:
-    const T_MODEL& Model() { return m_main->Doc().Data().Model(); }
     void OpenRecord(EXPLORER_TABLE table, int key)
     {
         EXPECT_TRUE(OpenUlfRecord(m_main->Desktop(), table, key));

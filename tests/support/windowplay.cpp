@@ -74,25 +74,9 @@ void Cancel(CDialogWindow& w)
     w.reject();
 }
 
-QWidget& Widget(CDialogWindow& w, const char* field)
-{
-    return *w.Form().Find(field)->widget;
-}
-
 QAbstractItemModel& Table(CDialogWindow& w, int index)
 {
     return w.findChildren<CGridView*>().at(index)->Model();
-}
-
-QString Cell(QAbstractItemModel& table, int row, int column)
-{
-    return table.index(row, column).data().toString();
-}
-
-bool SetCell(QAbstractItemModel& table, int row, int column, const QVariant& value)
-{
-    const bool flag = table.index(row, column).data(Qt::CheckStateRole).isValid();
-    return table.setData(table.index(row, column), value, flag ? Qt::CheckStateRole : Qt::EditRole);
 }
 
 // The class has no meta object of its own to be found by.

@@ -48,12 +48,8 @@ private:
 ACT Press(const char* key);
 void Cancel(CDialogWindow& w);
 
-/// The widget of a field by its name.
-QWidget& Widget(CDialogWindow& w, const char* field);
-/// The index-th table of the window, and its cells; flags take a check state.
+/// The index-th table of the window.
 QAbstractItemModel& Table(CDialogWindow& w, int index = 0);
-QString Cell(QAbstractItemModel& table, int row, int column);
-bool SetCell(QAbstractItemModel& table, int row, int column, const QVariant& value);
 /// Chooses a row of the first table.
 void ChooseRow(CDialogWindow& w, int row);
 /// The plot that the window shows, or an empty one.
