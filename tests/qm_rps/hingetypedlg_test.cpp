@@ -11,57 +11,40 @@ using C = HINGE_COMPONENT;
 using EL = HINGE_ELEMENT;
 constexpr auto kDist = HINGE_DEFINITION::CurvatureDistributed;
 
-struct T_OFFER {
-    EL element;
-    C component;
-    const char* options; // hysteresis (a)lternative, (d)egrading, (g)sd wanted, (G)sd allowed
-    bool euro;
-    const char* codes;  // "!" follows a disabled entry
-    const char* fourth; // end of the key under which code 4 is listed
-};
-const T_OFFER kOffers[] = {
-    {EL::BeamColumn, C::My, "", true, "014235", "SKCV_FEMA"},
-    {EL::BeamColumn, C::My, "", false, "014235!", "SKCV_FEMA"},
-    {EL::PointSpring, C::Fx, "", true, "601", ""},
-    {EL::BeamColumn, C::My, "adG", true, "0123", ""},
-    {EL::BeamColumn, C::Mz, "agG", true, "01423", "GSD_TYPE"},
-    {EL::BeamColumn, C::My, "ag", true, "0123", ""},
-    {EL::BeamColumn, C::Fx, "agG", true, "0123", ""},
-    {EL::Wall, C::Fx, "ad", true, "01423", "STRENGTH_DEG_TYPE"},
-    {EL::Truss, C::Fx, "d", true, "014235", "SKCV_FEMA"},
-};
+/// Codes of the curves offered ("!" follows a disabled one), and the key of code 4. Options:
+/// (a)lternative or (d)egrading hysteresis, (g)sd wanted, (G)sd allowed, (e) Eurocode.
+std::string Offers(EL element, C component, const std::string& options,
+                   HINGE_DEFINITION definition = HINGE_DEFINITION::MomentRotation)
+{
+    const auto has = [&](char c) { return options.find(c) != std::string::npos; };
+    T_HINGE_CONTEXT x;
+    x.altHysteresis = has('a'), x.strengthDegradation = has('d');
+    x.gsd = has('g'), x.gsdAllowed = has('G');
+    x.concreteCode = "Eurocode2:04";
+    x.steelCode = has('e') ? "Eurocode3" : "AIJ-ASD02";
+    T_PHGT_D type;
+    type.element = element, type.definition = definition;
+    std::string codes, fourth;
+    for (const auto& e : OfferedCurves(type, component, x)) {
+        codes += std::to_string(static_cast<int>(e.code)) + (e.enabled ? "" : "!");
+        if (e.code == SKEL_TYPE::Fema) fourth = std::string(" ") + e.key;
+    }
+    return codes + fourth;
+}
 
 TEST(HingeType, OffersCurveTypesByElementDefinitionAndOptions)
 {
-    const auto offered = [](const T_PHGT_D& type, const T_OFFER& o, std::string& fourth) {
-        const auto has = [&](char c) {
-            return std::string(o.options).find(c) != std::string::npos;
-        };
-        T_HINGE_CONTEXT x;
-        x.altHysteresis = has('a');
-        x.strengthDegradation = has('d');
-        x.gsd = has('g');
-        x.gsdAllowed = has('G');
-        x.concreteCode = "Eurocode2:04";
-        x.steelCode = o.euro ? "Eurocode3" : "AIJ-ASD02";
-        std::string codes;
-        for (const auto& e : OfferedCurves(type, o.component, x)) {
-            codes += std::to_string(static_cast<int>(e.code)) + (e.enabled ? "" : "!");
-            if (e.code == SKEL_TYPE::Fema) fourth = e.key;
-        }
-        return codes;
-    };
-    T_PHGT_D type;
-    std::string fourth;
-    for (const T_OFFER& o : kOffers) {
-        type.element = o.element;
-        fourth = "";
-        EXPECT_EQ(o.codes, offered(type, o, fourth)) << "row " << &o - kOffers;
-        EXPECT_TRUE(fourth.ends_with(o.fourth)) << fourth;
-    }
-    type.element = EL::Wall;
-    type.definition = kDist;
-    EXPECT_EQ("4", offered(type, {EL::Wall, C::Fx, "", true, "4", ""}, fourth));
+    const std::string fema = " IDS_RPS_PO_PHGT_SKCV_FEMA";
+    EXPECT_EQ("014235" + fema, Offers(EL::BeamColumn, C::My, "e"));
+    EXPECT_EQ("014235!" + fema, Offers(EL::BeamColumn, C::My, ""));
+    EXPECT_EQ("601", Offers(EL::PointSpring, C::Fx, "e"));
+    EXPECT_EQ("4" + fema, Offers(EL::Wall, C::Fx, "e", kDist));
+    EXPECT_EQ("0123", Offers(EL::BeamColumn, C::My, "eadG"));
+    EXPECT_EQ("01423 IDS_RPS_PO_PHGT_SKCV_GSD_TYPE", Offers(EL::BeamColumn, C::Mz, "eagG"));
+    EXPECT_EQ("0123", Offers(EL::BeamColumn, C::My, "eag"));
+    EXPECT_EQ("0123", Offers(EL::BeamColumn, C::Fx, "eagG"));
+    EXPECT_EQ("01423 IDS_RPS_PO_PHGT_SKCV_STRENGTH_DEG_TYPE", Offers(EL::Wall, C::Fx, "ead"));
+    EXPECT_EQ("014235" + fema, Offers(EL::Truss, C::Fx, "ed"));
 }
 
 T_PHGT_D ValidType()
@@ -114,34 +97,23 @@ TEST(HingeType, ReportsEveryFindingAndRefusesAsAWhole)
 TEST(HingeLength, FollowsCurveLocationAndOptions)
 {
     using L = HINGE_LOCATION;
-    const struct {
-        SKEL_TYPE type;
-        std::size_t component;
-        L location;
-        bool withheld, alt;
-        const char* needs;
-    } kCases[] = {
-        {SKEL_TYPE::Ec8, 4, L::BothEnds, false, false, "IJ"},
-        {SKEL_TYPE::Ec8, 0, L::BothEnds, false, false, ""},
-        {SKEL_TYPE::Ec8, 0, L::BothEnds, false, true, "IJ"},
-        {SKEL_TYPE::Ec8, 4, L::IEnd, false, false, "I"},
-        {SKEL_TYPE::Ec8, 4, L::JEnd, false, false, "J"},
-        {SKEL_TYPE::Ec8, 4, L::Center, false, true, ""},
-        {SKEL_TYPE::Ec8, 5, L::BothEnds, true, false, ""},
-        {SKEL_TYPE::Ec8, 5, L::BothEnds, true, true, "IJ"},
-        {SKEL_TYPE::Fema, 5, L::BothEnds, false, false, ""},
-    };
-    for (const auto& c : kCases) {
+    const auto needs = [](std::size_t i, L location, bool alt, bool withheld = false) {
         T_PHGT_D t;
-        const bool ec8 = c.type == SKEL_TYPE::Ec8;
-        t.components[c.component] =
-            ComponentWith(c.type, ec8 ? T_SKEL_CURVE(T_SKEL_EC8()) : T_SKEL_CURVE(T_SKEL_FEMA()));
-        t.components[c.component].location = c.location;
-        t.withholdMzLength = c.withheld;
-        const auto needs = LengthNeeds(t, c.alt)[c.component];
-        EXPECT_EQ(c.needs, std::string(needs.I ? "I" : "") + (needs.J ? "J" : ""))
-            << "row " << &c - kCases;
-    }
+        t.components[i] = ComponentWith(SKEL_TYPE::Ec8, T_SKEL_EC8());
+        t.components[i].location = location;
+        t.withholdMzLength = withheld;
+        const auto s = LengthNeeds(t, alt)[i];
+        return std::string(s.I ? "I" : "") + (s.J ? "J" : "");
+    };
+    EXPECT_EQ("IJ", needs(4, L::BothEnds, false));
+    EXPECT_EQ("", needs(0, L::BothEnds, false));
+    EXPECT_EQ("IJ", needs(0, L::BothEnds, true));
+    EXPECT_EQ("I", needs(4, L::IEnd, false));
+    EXPECT_EQ("J", needs(4, L::JEnd, false));
+    EXPECT_EQ("", needs(4, L::Center, true));
+    EXPECT_EQ("", needs(5, L::BothEnds, false, true));
+    EXPECT_EQ("IJ", needs(5, L::BothEnds, true, true));
+    EXPECT_FALSE(LengthNeeds(ValidType(), false)[4].I); // FEMA
 }
 
 TEST(HingeMasonry, ChecksStrengthsBeforeTheFormsOwnValue)

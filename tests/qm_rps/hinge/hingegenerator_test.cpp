@@ -1,12 +1,9 @@
 // Hinges generated for elements, their list, and what an element lacks.
 #include "hingesample.h"
-#include "qm_db/editscope.h"
 #include "qm_rps/hinge/hingegenerator.h"
 #include "qm_rps/hinge/hingetable.h"
 #include "qm_rps/pushoverhingedatatype.h"
 #include "qm_rps/pushoverhingelistdlg.h"
-#include "qm_rps/yieldstrengthcalcopteffdescdlg.h"
-#include "qm_rps/yieldstrengthcalcoptmatdescdlg.h"
 
 #include <gtest/gtest.h>
 
@@ -175,27 +172,4 @@ TEST(HingeDataType, ChecksTheDiagramBeforeTheCriteria)
         EXPECT_EQ(c.message, dlg.Messages().empty() ? "" : dlg.Messages().back().key);
     }
     EXPECT_EQ(1.3, std::get<T_SKEL_FEMA>(stored().components[4].curves.J).sides.pos.C.strength);
-}
-
-TEST(YieldStrengthCalcOpt, DescribesStrengthsAndEffectiveSections)
-{
-    CDBDoc doc;
-    T_SECT_D s;
-    s.name = "S", s.area = 6, s.Iyy = 2, s.Zy = 3, s.factorsJ.Iyy = 0.5;
-    T_MATL_D concrete;
-    concrete.name = "C", concrete.type = MATL_CLASS::Concrete;
-    concrete.fck = 25, concrete.fyk = 450;
-    CEditScope edit(doc, "model");
-    ASSERT_TRUE(edit.Put(1, s) && edit.Put(1, concrete) && edit.Put(1, T_ELEM_D{1, 1, 2, 1, 1}) &&
-                edit.Put(2, T_ELEM_D{2, 1, 2, 0, 0}) && edit.Commit());
-    const CYieldStrengthCalcOptMatDescDlg materials(doc, {1, 2});
-    ASSERT_EQ(2u, materials.Rows().size());
-    EXPECT_EQ(25, materials.Rows()[0].fck);
-    EXPECT_EQ(450, materials.Rows()[0].fyk);
-    EXPECT_FALSE(materials.Rows()[0].Fy.has_value());
-    EXPECT_STREQ("IDS_CMD_IEHP_NO_MATL", materials.Rows()[1].faultKey);
-    const CYieldStrengthCalcOptEffDescDlg sections(doc, {1, 2});
-    EXPECT_EQ(2, sections.Rows()[0].effective.I.Iyy);
-    EXPECT_EQ(1, sections.Rows()[0].effective.J.Iyy);
-    EXPECT_STREQ("IDS_CMD_IEHP_NO_SECT", sections.Rows()[1].faultKey);
 }
