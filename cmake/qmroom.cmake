@@ -28,7 +28,7 @@ function(qm_room name)
                                             $<INSTALL_INTERFACE:${CMAKE_INSTALL_INCLUDEDIR}>)
   target_link_libraries(${name} PUBLIC ${ROOM_DEPENDS}
                         PRIVATE $<BUILD_INTERFACE:qm_flags> ${ROOM_PRIVATE_DEPENDS})
-  target_precompile_headers(${name} PRIVATE ${QM_PCH_CORE})
+  qm_precompile(${name} ${QM_PCH_CORE})
 endfunction()
 
 # Heavy headers, parsed once for a target. Those of the core rooms are of the standard library alone:
@@ -46,7 +46,10 @@ set(QM_PCH_QT <QAbstractTableModel> <QApplication> <QBoxLayout> <QComboBox> <QDi
 # qm_precompile(<target> <header>...)
 function(qm_precompile target)
   target_precompile_headers(${target} PRIVATE ${ARGN})
-  # With precompiled headers GCC 12 reports std::string concatenation as overflowing (GCC bug 105329).
-  target_compile_options(${target} PRIVATE
-    $<$<CXX_COMPILER_ID:GNU>:-Wno-stringop-overflow -Wno-array-bounds>)
+  # With precompiled headers GCC 12 reports std::string concatenation as overflowing (GCC bug 105329);
+  # CMAKE_DISABLE_PRECOMPILE_HEADERS=ON brings both warnings back.
+  if(NOT CMAKE_DISABLE_PRECOMPILE_HEADERS)
+    target_compile_options(${target} PRIVATE
+      $<$<CXX_COMPILER_ID:GNU>:-Wno-stringop-overflow -Wno-array-bounds>)
+  endif()
 endfunction()
