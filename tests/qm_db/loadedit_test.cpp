@@ -65,41 +65,21 @@ T_LCOM_D Flat(CDBDoc& doc, const T_LCOM_D& in)
 
 } // namespace
 
-TEST(LoadEdit, EveryRecordIsPutErasedAndUndone)
+TEST(LoadEdit, RecordsAreFoundByTheirNames)
 {
     CDBDoc doc;
-    const T_MODEL blank = doc.Data().Model();
-    ASSERT_EQ(1, doc.Edit().Begin("all"));
-    const auto put = [&](auto... record) { ASSERT_TRUE((doc.Edit().Put(1, record) && ...)); };
-    put(T_DIAP_D{{1, 2}, 1}, T_EQDS_D{{1, 2}, {true}}, T_STLD_D{"G", {}, {}, {}, {}, {}, {}},
-        T_LCOM_D{"C", {{false, 1, 2.0}}}, T_ULFC_D{"D"}, T_ULFI_D{"T", 1, 0, 1, false, {}, {}},
-        T_MATL_D{}, T_SECT_D{}, T_ELEM_D{1, 1, 2, 1, 1, 0}, T_PHGT_D{}, T_PHGE_D{1, 1, {}, {}},
-        T_IEHP_D{}, T_POFC_D{"f", {0, 1}, {0, 1}});
-    ASSERT_EQ(1, doc.Edit().Commit());
-    const T_MODEL full = doc.Data().Model();
+    doc.Data().Assign(Used());
     CAttrCtrl& attr = doc.Attr();
     T_LCOM_D combination;
     T_ULFC_D constraint;
-    EXPECT_TRUE(attr.GetLcom_("C", combination) && attr.GetUlfc_("D", constraint));
-    EXPECT_FALSE(attr.GetLcom_("D", combination) || attr.GetUlfc_("C", constraint));
-    EXPECT_TRUE(attr.ExistLcom("C") && !attr.ExistLcom("c"));
-    int key = 0;
-    EXPECT_TRUE(attr.FindStld("G", key) && attr.GetLcomKey("C", key) && attr.FindUlfi("T", key));
-    EXPECT_EQ(0, attr.FindStld("C", key));
-
-    ASSERT_EQ(1, doc.Edit().Begin("erase"));
-    EXPECT_EQ(0, doc.Edit().Erase<T_LCOM_D>(1) + doc.Edit().Erase<T_ELEM_D>(1)); // in use
-    ASSERT_TRUE(doc.Edit().Erase<T_ULFI_D>(1) && doc.Edit().Erase<T_LCOM_D>(1) &&
-                doc.Edit().Erase<T_STLD_D>(1) && doc.Edit().Erase<T_ULFC_D>(1) &&
-                doc.Edit().Erase<T_DIAP_D>(1) && doc.Edit().Erase<T_EQDS_D>(1) &&
-                doc.Edit().Erase<T_PHGE_D>(1) && doc.Edit().Erase<T_ELEM_D>(1) &&
-                doc.Edit().Erase<T_MATL_D>(1) && doc.Edit().Erase<T_SECT_D>(1) &&
-                doc.Edit().Erase<T_PHGT_D>(1) && doc.Edit().Erase<T_IEHP_D>(1) &&
-                doc.Edit().Erase<T_POFC_D>(1));
-    ASSERT_EQ(1, doc.Edit().Commit());
-    EXPECT_EQ(blank, doc.Data().Model());
-    ASSERT_EQ(1, doc.Undo().Undo());
-    EXPECT_EQ(full, doc.Data().Model());
+    EXPECT_TRUE(attr.GetLcom_("C2", combination) && attr.GetUlfc_("mid", constraint));
+    EXPECT_EQ("C2mid", combination.name + constraint.name);
+    EXPECT_FALSE(attr.GetLcom_("mid", combination) || attr.GetUlfc_("C2", constraint));
+    EXPECT_TRUE(attr.ExistLcom("C1") && !attr.ExistLcom("c1"));
+    int load = 0, key = 0, item = 0;
+    EXPECT_TRUE(attr.FindStld("S", load) && attr.GetLcomKey("C2", key) && attr.FindUlfi("T", item));
+    EXPECT_EQ((std::array{2, 2, 1}), (std::array{load, key, item}));
+    EXPECT_EQ(0, attr.FindStld("C1", key));
 }
 
 TEST(LoadEdit, WhatIsUsedIsNotErasedAndItsUsersAreNamed)

@@ -21,41 +21,19 @@ TEST(StructCase, TheTextOfEveryMemberComesBackLetterForLetter)
     ExpectRoundTrips(content, "all members");
 }
 
-// From kN and m by hand: 1 kN = 1000 N; mass kN s2/m = 1000 kg.
+// From kN and m by hand, what the engine's model does not show: 1 kN = 1000 N.
 TEST(StructCase, ReadsMembersIntoTheirFieldsInSi)
 {
     const T_MODEL m = ParseGood(AllText()).model;
-    EXPECT_EQ(MODEL_PLANE::XZ, m.styp.plane);
     const T_MATL_D& steel = m.materials.at(1);
-    EXPECT_DOUBLE_EQ(8.1e10, *steel.G);
     EXPECT_DOUBLE_EQ(7850.0, steel.density);
     EXPECT_EQ(1.2e-5, steel.alpha);
     EXPECT_DOUBLE_EQ(355e6, steel.Fy);
-    EXPECT_FALSE(m.materials.at(4).G);
-    EXPECT_EQ(SECT_SHAPE::Value, m.sections.at(1).shape);
     EXPECT_EQ(3.69e-5, m.sections.at(1).Iyy);
-
-    const T_ELEM_D& beam = m.elements.at(1);
-    EXPECT_EQ((std::array<double, 3>{0, 1, 0}), beam.zAxis);
-    EXPECT_EQ((T_DIRS6{true, false, false, false, false, true}), beam.release.I);
-    EXPECT_EQ((std::array<double, 3>{0, 0, -0.2}), beam.offset.J);
-    EXPECT_EQ(4, m.elements.at(2).material);
-    EXPECT_EQ((std::array<double, 6>{1e6, 2e6, 3e6, 4e4, 5e4, 6e4}), m.elements.at(3).stiffness);
-    EXPECT_EQ(ELEM_KIND::Spring, m.elements.at(7).kind);
-    EXPECT_EQ(0, m.diaphragms.at(5).normal);
-
-    const T_STLD_D& g = m.loadCases.at(1);
-    EXPECT_EQ((std::array<double, 6>{1e4, 2e4, 3e4, 1e3, 2e3, 3e3}), g.nodal[0].load);
-    EXPECT_EQ(
-        (T_BEAM_LOAD{
-            1, BEAM_LOAD_AXES::Global, 0, BEAM_LOAD_TYPE::Distributed, {1e3, 0}, {0.25, 0.75}}),
-        g.beam[1]);
+    EXPECT_EQ((std::array<double, 3>{0, 1, 0}), m.elements.at(1).zAxis);
     EXPECT_EQ(
         (T_BEAM_LOAD{1, BEAM_LOAD_AXES::Local, 1, BEAM_LOAD_TYPE::Point, {1e4, 0}, {0.3, 1.0}}),
-        g.beam[2]);
-    EXPECT_EQ(-0.01, g.settlement[0].displacement[2]);
-    EXPECT_EQ(-20.0, g.temperature[0].change);
-    EXPECT_EQ(1e5, g.pretension[0].force);
+        m.loadCases.at(1).beam[2]);
     EXPECT_EQ((std::vector<T_LCOM_ITEM>{{false, 1, 1.35}, {true, 2, 0.7}}),
               m.combinations.at(1).items); // C0 stands behind C1
 

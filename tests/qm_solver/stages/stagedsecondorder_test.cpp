@@ -2,7 +2,6 @@
 #include "staged.h"
 
 #include "qm_solver/element/cablesag.h"
-#include "qm_solver/element/spanload.h"
 
 #include <cmath>
 #include <functional>
@@ -120,32 +119,6 @@ TEST(StagedSecondOrder, AColumnBeyondItsLoadBuckles)
             EXPECT_EQ(0, error.stage);
             EXPECT_NE(std::string::npos, error.reason.Text().find("buckles"));
         }
-}
-
-TEST(StagedSecondOrder, GeometricStiffnessIsTheIntegralOfSlopes)
-{
-    // Slopes of the deflections by differences, the integral by the midpoint rule.
-    const T_BEAM_SHAPE shape{3.0, 2.0, 0.7};
-    T_MATRIX12 k{}, sum{};
-    AddGeometricStiffness(shape, 5.0, k);
-    const std::size_t parts = 3000;
-    const double dx = shape.length / double(parts);
-    for (std::size_t p = 0; p < parts; ++p) {
-        std::array<std::array<double, 2>, 12> slope;
-        for (std::size_t i = 0; i < 12; ++i) {
-            T_VEC12 unit{};
-            unit[i] = 1.0;
-            const auto a = DeflectionAt(shape, dx * double(p), unit),
-                       b = DeflectionAt(shape, dx * double(p + 1), unit);
-            slope[i] = {(b[0] - a[0]) / dx, (b[1] - a[1]) / dx};
-        }
-        for (std::size_t i = 0; i < 12; ++i)
-            for (std::size_t j = 0; j < 12; ++j)
-                sum[i][j] += 5.0 * dx * (slope[i][0] * slope[j][0] + slope[i][1] * slope[j][1]);
-    }
-    for (std::size_t i = 0; i < 12; ++i)
-        for (std::size_t j = 0; j < 12; ++j)
-            EXPECT_NEAR(sum[i][j], k[i][j], 1e-5) << i << " " << j;
 }
 
 TEST(StagedSecondOrder, ATightStringStiffensAcrossItself)
