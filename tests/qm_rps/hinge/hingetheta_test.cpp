@@ -73,16 +73,15 @@ TEST(HingeTheta, IsZeroWithoutBasisOrStiffness)
 {
     const T_SECT_D section = Section();
     const T_MATL_D material = Material();
-    const auto moment = [&](const T_SECT_D* s, const T_MATL_D* m, double length, double user) {
-        const S option = user != 0.0 ? S::User : S::EI6L;
-        return CHingeTheta::CalcThetaMoment({s, m, length}, C::My, L::IEnd, option, user, 1.0);
+    const auto moment = [](const T_THETA_LOOKUP& lookup, S option, double user) {
+        return CHingeTheta::CalcThetaMoment(lookup, C::My, L::IEnd, option, user, 1.0);
     };
-    EXPECT_EQ(0.0, moment(nullptr, &material, 1, 5));
-    EXPECT_EQ(0.0, moment(&section, nullptr, 1, 5));
-    EXPECT_EQ(0.0, moment(&section, &material, 0, 0)) << "no length";
-    EXPECT_EQ(0.0, moment(&section, &material, 1, -5)) << "negative stiffness";
-    EXPECT_EQ(0.0, moment(&section, &material, 1, 0.9e-10));
-    EXPECT_DOUBLE_EQ(1 / 1.1e-10, moment(&section, &material, 1, 1.1e-10));
+    EXPECT_EQ(0.0, moment({nullptr, &material, 1}, S::User, 5));
+    EXPECT_EQ(0.0, moment({&section, nullptr, 1}, S::User, 5));
+    EXPECT_EQ(0.0, moment({&section, &material, 0}, S::EI6L, 0)) << "no length";
+    for (const double user : {-5.0, 0.9e-10})
+        EXPECT_EQ(0.0, moment({&section, &material, 1}, S::User, user)) << user;
+    EXPECT_DOUBLE_EQ(1 / 1.1e-10, moment({&section, &material, 1}, S::User, 1.1e-10));
 }
 
 TEST(HingeTheta, TakesTheInertiaOfAShapeFromItsDimensions)
