@@ -60,9 +60,10 @@ EXIT_CODE DrawShape(CDBDoc& doc, const T_ANALYSE_OPTIONS& o, const T_SHOWN& show
                             Say("IDS_QM_CLI_NO_MODE", std::to_string(o.plotMode)));
         const T_MODE_RESULTS& m = shown.modes[static_cast<std::size_t>(o.plotMode - 1)];
         shape.mode = true;
-        shape.subtitle = "Mode " + std::to_string(o.plotMode);
+        const std::string number = std::to_string(o.plotMode);
+        shape.subtitle = Say("IDS_PUSHOVER_Mode__d", number);
         shape.states.push_back(
-            StateOf(FormatText("Mode %d, T = %.4g s", o.plotMode, m.period), m.shape));
+            StateOf(Say("IDS_QM_PLOT_MODE", number, FormatText("%.4g", m.period)), m.shape));
         return WritePicture(ShapePlot(shape), o.plot);
     }
     const auto it = std::ranges::find_if(shown.cases, [&](const T_SHOWN_CASE& c) {

@@ -55,8 +55,8 @@ int main(int argc, char** argv)
             argc > 1 && argv[1][0] != '-' &&
             app.get_subcommands([&](const CLI::App* s) { return s->get_name() == argv[1]; })
                 .empty();
-        const std::string what =
-            unknown ? Say("IDS_QM_CLI_UNKNOWN_COMMAND", std::string(argv[1])) : e.what();
+        const std::string what = unknown ? Say("IDS_QM_CLI_UNKNOWN_COMMAND", std::string(argv[1]))
+                                         : ParserWords(e.what());
         return ToInt(Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_SEE_HELP", what)));
     }
     if (std::fflush(stdout) != 0 || std::ferror(stdout) != 0) {

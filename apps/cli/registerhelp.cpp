@@ -1,7 +1,12 @@
 // The help in the user's language: what the argument parser itself says, and its labels.
+#include "qm_base/messagetext.h"
 #include "qm_rps/pushover/pushoverreport.h"
 #include "registershared.h"
 #include "registrations.h"
+
+#include <optional>
+#include <string_view>
+#include <vector>
 
 namespace {
 
@@ -26,7 +31,45 @@ public:
     }
 };
 
+// What the parser says: the English texts are its own words, so they tell what fills the places.
+constexpr const char* kRefusals[] = {
+    "IDS_QM_CLI_ARG_SUBCOMMAND", "IDS_QM_CLI_ARG_EXTRA",    "IDS_QM_CLI_ARG_EXTRAS",
+    "IDS_QM_CLI_ARG_CONVERT",    "IDS_QM_CLI_ARG_RANGE",    "IDS_QM_CLI_ARG_CHOICE",
+    "IDS_QM_CLI_ARG_LEAST",      "IDS_QM_CLI_ARG_MOST",     "IDS_QM_CLI_ARG_MISSING",
+    "IDS_QM_CLI_ARG_REQUIRES",   "IDS_QM_CLI_ARG_EXCLUDES", "IDS_QM_CLI_ARG_REQUIRED",
+};
+
+/// What fills the places of `text` from left to right to give `words`; nullopt: nothing does.
+std::optional<std::vector<std::string>> PlacesIn(std::string_view text, std::string_view words)
+{
+    constexpr std::size_t kPlace = 3; // "{1}"
+    std::vector<std::string> args;
+    for (std::size_t brace; (brace = text.find('{')) != text.npos;) {
+        if (!words.starts_with(text.substr(0, brace))) return std::nullopt;
+        words.remove_prefix(brace);
+        text.remove_prefix(brace + kPlace);
+        const std::string_view next = text.substr(0, text.find('{'));
+        const std::size_t end = next.empty() ? words.size() : words.find(next);
+        if (end == words.npos) return std::nullopt;
+        args.emplace_back(words.substr(0, end));
+        words.remove_prefix(end);
+    }
+    return words == text ? std::optional(args) : std::nullopt;
+}
+
 } // namespace
+
+std::string ParserWords(const std::string& what)
+{
+    using zql::lib::MMSGFunction;
+    for (const char* const key : kRefusals) {
+        const auto args = PlacesIn(MMSGFunction::GetValueOf("en", key), what);
+        if (!args) continue;
+        const std::vector<std::string_view> views(args->begin(), args->end());
+        return zql::lib::FillPlaces(MMSGFunction::GetValue(key), views);
+    }
+    return what;
+}
 
 void AddHelp(CLI::App& app)
 {

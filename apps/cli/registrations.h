@@ -4,12 +4,16 @@
 
 #include "exitcodes.h"
 
+#include <string>
+
 namespace CLI {
 class App;
 }
 
 /// Description, labels, version and what stands below; the commands take them over.
 void AddHelp(CLI::App& app);
+/// What the argument parser refuses, in the language of the user.
+std::string ParserWords(const std::string& what);
 void AddModel(CLI::App& app, EXIT_CODE& code);
 void AddEvaluations(CLI::App& app, EXIT_CODE& code);
 void AddHingeCommands(CLI::App& app, EXIT_CODE& code);
