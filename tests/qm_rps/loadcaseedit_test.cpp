@@ -120,50 +120,6 @@ TEST_F(LoadCaseEdit, ANewCaseGetsAFreeKeyAndNameAndMustBeFilled)
     EXPECT_EQ("IDS_QM_UI_POLC_GONE", LastMessage());
 }
 
-TEST_F(LoadCaseEdit, ARowThatIsChosenBecomesTheInput)
-{
-    Open("hinge-library");
-    CPO_LoadCaseDlg dialog;
-    Start(dialog);
-    const CPO_LoadCaseDlg::T_PATTERN_INPUT added{.kind = 1, .directionIndex = 1, .factor = -2.5};
-    ASSERT_EQ(1, dialog.OnAddPattern(added));
-    dialog.SelectPattern(0);
-    EXPECT_EQ(std::pair(0, 1), std::pair(dialog.m_input.kind, dialog.m_input.loadCase));
-    dialog.SelectPattern(1);
-    EXPECT_EQ(std::pair(1, -2.5), std::pair(dialog.m_input.directionIndex, dialog.m_input.factor));
-    dialog.SelectPattern(9);
-    EXPECT_EQ(-1, dialog.m_selected);
-}
-
-TEST_F(LoadCaseEdit, TheListAddsModifiesCopiesAndDeletes)
-{
-    Open("hinge-library");
-    CPO_LoadCaseListDlg list;
-    Start(list);
-    EXPECT_EQ(0, list.OnModify());
-    EXPECT_EQ("IDS_QM_UI_POLC_NONE_CHOSEN", LastMessage());
-    for (const char* name : {"Copy of PX", "New 1"}) { // the first is taken at the second time
-        list.m_selected = 1;
-        ASSERT_EQ(1, list.OnCopy());
-        EXPECT_EQ(name, Model().pushovers.at(list.m_selected).name);
-    }
-    m_view.m_run = [](zql::frx::MDialog& dialog) {
-        dynamic_cast<CPO_LoadCaseDlg&>(dialog).m_case.control->masterMaxDispl = 0.5;
-        return dialog.OnOK();
-    };
-    list.m_selected = 2;
-    ASSERT_EQ(1, list.OnModify());
-    EXPECT_EQ(0.5, Model().pushovers.at(2).control->masterMaxDispl);
-    ASSERT_EQ(1, list.OnAdd());
-    EXPECT_EQ(4, list.m_selected);
-    ASSERT_EQ(1, list.OnDelete());
-    EXPECT_EQ(0, list.m_selected);
-    m_view.m_run = {};
-    EXPECT_EQ(0, list.OnAdd()); // cancelled
-    ASSERT_EQ(3U, list.Rows().size());
-    EXPECT_EQ("3", list.Rows()[2].cells[0]);
-}
-
 TEST_F(LoadCaseEdit, AUsedCaseStaysAndItsUsersAreNamed)
 {
     Open("rc-frame-3-storey");

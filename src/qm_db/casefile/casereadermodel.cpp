@@ -68,6 +68,7 @@ void ReadHead(CJsonReader& root, T_MODEL& model)
         root.FailAt("format", "IDS_QM_CASE_FORMAT", QuotedText(format), QuotedText(kCaseFormat));
     const CCaseNames names(model);
     CCaseGet get(root, model.styp.units, {}, &names);
+    get.Must("units"); // no number means anything without them
     HeadFields(get, model.styp);
 }
 

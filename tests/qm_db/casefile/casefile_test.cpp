@@ -38,103 +38,14 @@ std::string RefusalOf(const std::string& text)
     return error.text;
 }
 
-/// The good case with one spot replaced; the first occurrence after `anchor`.
-std::string Spoiled(const char* anchor, const char* from, const char* to)
-{
-    std::string text = AllMembers();
-    const std::size_t at = text.find(from, text.find(anchor));
-    EXPECT_NE(std::string::npos, text.find(anchor)) << anchor;
-    EXPECT_NE(std::string::npos, at) << from;
-    return text.replace(at, std::string(from).size(), to);
-}
-
-struct T_BAD {
-    const char* anchor; // text before the spot
-    const char* from;
-    const char* to;
-    const char* message; // after "case.json: "
-};
-
-// clang-format off
-const T_BAD kBad[] = {
-    // the document
-    {"", "\"gravity\"", "\"gravitas\"", "unknown key \"gravitas\""},
-    {"", "\"gravity\"", "\"bad\\nkey\"", "unknown key \"bad\\u000akey\""},
-    {"", "386.2", "0", "gravity: gravity must be above 0"},
-    {"", "386.2", "null", "gravity: expected a number, found null"},
-    {"", "\"nodes\"", "\"storeys\"", "key \"storeys\" appears twice"},
-    // nodes
-    {"\"id\": 2", "2", "0", "nodes[1].id: a node id must be above 0"},
-    {"\"id\": 2", "2", "2.5", "nodes[1].id: 2.5 is not an integer"},
-    {"\"id\": 2", "2", "4294967298", "nodes[1].id: 4294967298 is not an integer"},
-    {"\"id\": 2", "-0.5", "\"a\"", "nodes[1].xyz[1]: expected a number, found a text"},
-    {"\"id\": 2", "-0.5, ", "", "nodes[1].xyz: 2 values, expected 3"},
-    {"\"id\": 2", "-0.5", "1e308", "OK"}, // becomes 2.54e306 m
-    {"\"id\": 2", "2.6473775", "1e308", "nodes[1]: a value is too large"}, // 1.75e313 kg
-    {"\"id\": 2", "\"mass\": [2.6473775, 1.035643, 0.71607127], ", "", "OK"},
-    {"\"restraint\"", "1, 1, 1", "1, 2, 1", "nodes[0].restraint[1]: a restraint is 0 or 1"},
-    // storeys
-    {"storeys", "\"1F\"", "\"\"", "storeys[0].name: a name can't be empty"},
-    {"storeys", "\"2F\"", "\"1F\"", "storeys[1].name: \"1F\" appears twice"},
-    {"storeys", "\"2F\"", "\"2\\tF\"", "storeys[1].name: a name can't have control characters"},
-    {"storeys", "117.06", "0", "storeys[1].height: a storey height must be above 0"},
-    {"storeys", "[7]", "[7, 7]", "storeys[1].nodes[1]: the node appears twice"},
-    // modes
-    {"modes", "0.7", "0", "modes[0].period: a period must be above 0"},
-    {"modes", "\"7\"", "\"07\"", "modes[0].shape.\"07\": the key must be a node id"},
-    // spectra
-    {"\"atc40\"", "0.4", "0", "spectra[0].Ca: the value must be above 0"},
-    {"\"atc40\"", "\"Ca\": 0.4,", "", "spectra[0]: \"Ca\" is missing"},
-    {"\"atc40\"", "false", "0", "spectra[0].floors: expected true or false, found a number"},
-    {"\"ec8-2004\"", "\"type\": 2", "\"type\": 3", "spectra[1].type: the type is 1 or 2"},
-    {"\"ec8-2004\"", "0.35", "0", "spectra[1].ag: the value must be above 0"},
-    {"\"ec8-2004\"", "\"E\"", "\"F\"",
-     "spectra[1].soil: unknown soil \"F\"; allowed: A, B, C, D, E"},
-    {"\"ec8-2004\"", "\"damping\": 4", "\"damping\": -1",
-     "spectra[1].damping: damping can't be negative"},
-    {"\"ec8-2004\"", "\"TB\": 0.1", "\"TB\": 0.5", "spectra[1].TC: TC is below TB"},
-    {"\"ec8-2004\"", "\"TD\": 2.5", "\"TD\": 0.3", "spectra[1].TD: TD is below TC"},
-    {"\"ntc\"", "0.28", "0", "spectra[3].limit_states.SLD.\"TC*\": the value must be above 0"},
-    {"\"user\",", "[0, 0.5", "[-1, 0.5", "spectra[4].T[0]: a period can't be negative"},
-    {"\"user\",", "386.4", "-1", "spectra[4].gravity: gravity must be above 0"},
-    // pushover load cases
-    {"pushover", ", \"modes\": [1]", "",
-     "pushover[0].pattern: this kind of pattern needs at least one mode number in \"modes\""},
-    {"pushover", "[1]", "[2]", "pushover[0].pattern.modes[0]: there is no such mode"},
-    {"pushover", "[1]", "[0]", "pushover[0].pattern.modes[0]: mode numbers start at 1"},
-    {"pushover", "180", "1e308", "pushover[0].steps.base_reaction: a value is too large"},
-    {"pushover", "\"2\"", "\"7\"", "pushover[0].steps.displacement: key \"7\" appears twice"},
-    {"pushover", "-2]", "-3]", "pushover[0].limit_state_steps.EC8[2]: a step is -2 or above"},
-    // evaluations
-    {"evaluations", "FEMA440", "NTC2008",
-     "evaluations[0].procedure: only ATC-40 and FEMA440 have procedures"},
-    {"evaluations", "\"behavior\": 3", "\"behavior\": 4",
-     "evaluations[0].behavior: the behavior is 0, 1, 2 or 3"},
-    {"evaluations", "2.5", "-1", "evaluations[0].elastic_damping: damping is 0 to 100 per cent"},
-    {"evaluations", "2.5", "101", "evaluations[0].elastic_damping: damping is 0 to 100 per cent"},
-    {"evaluations", "\"drift_kind\": 2", "\"drift_kind\": 3",
-     "evaluations[0].drift_kind: the drift kind is 1 or 2"},
-    {"evaluations", "\"plot_type\": 4", "\"plot_type\": 9",
-     "evaluations[0].plot_type: the plot type is 0 to 8"},
-    {"evaluations", "\"ntc\"", "\"opcm\"",
-     "evaluations[0].bilinear.rule: unknown bilinear rule \"opcm\"; allowed: ec8, ntc, masonry"},
-    {"evaluations", "0.75", "0",
-     "evaluations[0].bilinear.secant: the fraction is above 0 and up to 1"},
-    {"evaluations", "0.8", "1.1",
-     "evaluations[0].bilinear.drop: the fraction is above 0 and up to 1"},
-};
-// clang-format on
-
 TEST(CaseFile, RefusesEachBadInputWithItsPlace)
 {
-    for (const T_BAD& bad : kBad) {
-        SCOPED_TRACE(std::string(bad.from) + " -> " + bad.to);
-        const std::string text = Spoiled(bad.anchor, bad.from, bad.to);
-        if (std::string("OK") == bad.message)
-            ParseGood(text);
-        else
-            EXPECT_EQ("case.json: " + std::string(bad.message), RefusalOf(text));
-    }
+    ExpectRefused(AllMembers(), "refusals.txt");
+    std::string text = AllMembers(); // what may be left out, and 2.54e306 m
+    for (const auto& [from, to] :
+         {std::pair{"\"mass\": [2.6473775, 1.035643, 0.71607127], ", ""}, {"-0.5", "1e308"}})
+        text.replace(text.find(from), std::string(from).size(), to);
+    ParseGood(text);
 }
 
 TEST(CaseFile, NamesLineAndColumnOfTextThatIsNoJson)
