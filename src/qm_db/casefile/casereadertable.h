@@ -4,6 +4,8 @@
 #include "qm_db/casefile/caseget.h"
 #include "qm_db/casefile/casereader.h"
 
+#include <limits>
+
 /// The keys of a record's members.
 class CKeysOf : public CFieldLook<CKeysOf> {
 public:
@@ -38,7 +40,8 @@ public:
 /// Key of the next record: one more than the last, or a higher one that it states.
 inline int ReadKey(CJsonReader& item, int last)
 {
-    int key = last + 1;
+    constexpr int kLargest = std::numeric_limits<int>::max();
+    int key = last < kLargest ? last + 1 : last; // no key is left behind the largest
     item.GetIf("key", key);
     item.Check("key", key > last, "IDS_QM_CASE_KEYS_RISE");
     return key;
@@ -83,9 +86,12 @@ void ReadTable(CJsonReader& root, const CCaseNames& names, const T_RECORD_ROW<R>
     const auto read = [&](CJsonReader& item, std::size_t) {
         R record;
         ReadRecord(item, names, model.styp.units, row, more, taken, record);
-        int key = table.empty() ? 1 : table.rbegin()->first + 1; // as they count
-        if constexpr (RowOf<R>().key == CASE_KEY::Member) key = record.id;
-        if (row.key == CASE_KEY::Stated) key = ReadKey(item, key - 1);
+        const int last = table.empty() ? 0 : table.rbegin()->first;
+        int key = 0;
+        if constexpr (RowOf<R>().key == CASE_KEY::Member)
+            key = record.id;
+        else
+            key = row.key == CASE_KEY::Stated ? ReadKey(item, last) : last + 1;
         check(item, key, record);
         if (!table.try_emplace(key, std::move(record)).second && row.key == CASE_KEY::Member)
             item.FailAt("id", "IDS_QM_CASE_RECORD_TWICE", Say(row.noun), std::to_string(key));

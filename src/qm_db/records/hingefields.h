@@ -288,8 +288,8 @@ void CaseFields(V& v, T_FIELD_REF<V, T_PHGT_D> r)
     v.EnumOpt("material", r.material, d.material, kMatlNames, "IDS_QM_CHOICE_MATERIAL");
     v.OptKeyRef("section", r.section, KindOf<T_SECT_D>());
     v.OptKeyRef("section_material", r.sectionMaterial, KindOf<T_MATL_D>());
-    v.Opt("fibre_section", r.fibreSection, 0);
-    v.Opt("thickness_section", r.thicknessSection, 0);
+    v.OptKeyRef("fibre_section", r.fibreSection, KindOf<T_SECT_D>());
+    v.OptKeyRef("thickness_section", r.thicknessSection, KindOf<T_SECT_D>());
     v.Part("components", r.components, r.definition);
     v.PartIf("yield_surface", r.yieldSurface);
     v.PartIf("pmm", r.pmm);
