@@ -22,7 +22,9 @@ void ChooseLanguage(int argc, char** argv)
         value.remove_prefix(kOption.size());
         if (value.starts_with('='))
             value.remove_prefix(1);
-        else if (value.empty() && i + 1 < argc)
+        else if (!value.empty())
+            continue; // another option that begins so
+        else if (i + 1 < argc)
             value = argv[++i];
         (void)!zql::lib::MMSGFunction::SetLanguage(value);
     }

@@ -113,11 +113,13 @@ int CLoadCombinationDlg::OnOK()
 {
     if (!CheckData()) return 0;
     const int key = m_key ? m_key : NextKey(m_doc.Data().Model().combinations);
-    CEditScope edit(m_doc, m_combination.name);
-    if (!edit.IsOpen()) return 0;
-    if (edit.Put(key, m_combination) && edit.Commit()) {
-        m_key = key;
-        return 1;
+    {
+        CEditScope edit(m_doc, m_combination.name);
+        if (!edit.IsOpen()) return 0;
+        if (edit.Put(key, m_combination) && edit.Commit()) {
+            m_key = key;
+            return 1;
+        }
     }
     // What the check could not see: another combination contains this one.
     constexpr const char* kCycle = "IDS_QM_DB_LCOM_CYCLE";

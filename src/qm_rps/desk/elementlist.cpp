@@ -21,8 +21,8 @@ bool AddPart(std::string_view part, std::vector<int>& ids)
         if (read.ec != std::errc() || read.ptr != end) return false;
     }
     if (to < from || to - from >= kLargestRange) return false;
-    for (int id = from; id <= to; ++id)
-        ids.push_back(id);
+    for (int i = 0; i <= to - from; ++i) // to may be the largest number
+        ids.push_back(from + i);
     return true;
 }
 
