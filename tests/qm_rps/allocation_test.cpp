@@ -64,21 +64,16 @@ TEST(Allocation, MoreTrialsAllocateNothingMore)
 {
     const T_POINTS example = Atc40ExampleCurve();
     const T_JOB soft{Bilinear(10, 0.1, -0.02, 400), Atc40(0.3), 2};
-    const struct {
-        char procedure;
-        T_JOB few, many;
-    } cases[] = {
-        {'A', {example, kExampleSd, 2}, {example, kExampleSd, 0}},
-        {'B', {example, kExampleSd, 1}, {Bilinear(10, 0.1, 0.05, 2000), Atc40(0.44), 0}},
-        {'a', {example, kExampleSd, 1}, soft},
-        {'b', {example, kExampleSd, 1}, soft},
-        {'c', {example, kExampleSd, 1}, {Bilinear(10, 0.1, 0.2, 2000), kExampleSd, 1}},
-    };
-    for (const auto& c : cases) {
-        const T_COUNT few = Count(c.procedure, c.few), many = Count(c.procedure, c.many);
-        EXPECT_LT(few.trials, many.trials) << c.procedure;
+    const auto expect = [](char procedure, const T_JOB& fewer, const T_JOB& more) {
+        const T_COUNT few = Count(procedure, fewer), many = Count(procedure, more);
+        EXPECT_LT(few.trials, many.trials) << procedure;
         EXPECT_GT(few.spectrum, 0u) << "the counter sees them";
-        EXPECT_EQ(few.spectrum, many.spectrum) << c.procedure;
-        EXPECT_TRUE(few.all == many.all || c.procedure == 'B' || c.procedure == 'c') << c.procedure;
-    }
+        EXPECT_EQ(few.spectrum, many.spectrum) << procedure;
+        EXPECT_TRUE(few.all == many.all || procedure == 'B' || procedure == 'c') << procedure;
+    };
+    expect('A', {example, kExampleSd, 2}, {example, kExampleSd, 0});
+    expect('B', {example, kExampleSd, 1}, {Bilinear(10, 0.1, 0.05, 2000), Atc40(0.44), 0});
+    expect('a', {example, kExampleSd, 1}, soft);
+    expect('b', {example, kExampleSd, 1}, soft);
+    expect('c', {example, kExampleSd, 1}, {Bilinear(10, 0.1, 0.2, 2000), kExampleSd, 1});
 }

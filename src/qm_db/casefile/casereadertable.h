@@ -43,7 +43,7 @@ inline int ReadKey(CJsonReader& item, int last)
     constexpr int kLargest = std::numeric_limits<int>::max();
     int key = last < kLargest ? last + 1 : last; // no key is left behind the largest
     item.GetIf("key", key);
-    item.Check("key", key > last, "IDS_QM_CASE_KEYS_RISE");
+    if (key <= last) item.FailAt("key", "IDS_QM_CASE_KEYS_RISE");
     return key;
 }
 
