@@ -144,6 +144,7 @@ int CPostCtrl::SelectPushover(int loadCase)
         return 0;
     }
     if (before != loadCase || m_revision != m_data.Revision()) {
+        m_levels.clear(); // they look into the series
         m_series.clear();
         m_factors.clear();
         m_reactions.clear();
@@ -228,50 +229,43 @@ bool CPostCtrl::ExistNodePost(int node) const
     return Source() && Source()->HasNode(node);
 }
 
-// Mean displacement of a storey's nodes that have results; weighted by mass where asked for and
-// where the storey has mass in the direction. Empty where no node has results.
-std::optional<double> CPostCtrl::StoreyMean(const T_STOR_D& storey, std::size_t step, bool byMass,
-                                            int direction)
+// In the units of the document; a level without results adds its height to the next one.
+int CPostCtrl::ReadLevels()
 {
-    double sum = 0.0, weight = 0.0, plain = 0.0;
-    int count = 0;
-    for (const int node : storey.nodes) {
-        const std::vector<double>* series = nullptr;
-        if (!ReadSeries(node, series)) continue;
-        const auto it = m_data.Model().nodes.find(node);
-        const double m = byMass && direction < 3 && it != m_data.Model().nodes.end()
-                             ? it->second.mass[static_cast<std::size_t>(direction)]
-                             : 0.0;
-        sum += m * (*series)[step];
-        weight += m;
-        plain += (*series)[step];
-        ++count;
+    if (!m_levels.empty()) return 1;
+    const auto direction = static_cast<std::size_t>(Direction());
+    double height = 0.0;
+    for (const auto& [key, storey] : m_data.Model().storeys) {
+        height += FromSi(storey.height, m_data.Units(), kDimLength);
+        T_LEVEL level{key, height, {}};
+        for (const int id : storey.nodes) {
+            const auto node = m_data.Model().nodes.find(id);
+            T_LEVEL_NODE& at = level.nodes.emplace_back();
+            if (node == m_data.Model().nodes.end() || !ReadSeries(id, at.moves)) {
+                level.nodes.pop_back();
+                continue;
+            }
+            for (const std::size_t axis : {0U, 1U})
+                at.plan[axis] = FromSi(node->second.xyz[axis], m_data.Units(), kDimLength);
+            if (direction < 3) at.mass = node->second.mass[direction];
+        }
+        if (level.nodes.empty() || !(height > 0.0)) continue;
+        if (!m_levels.empty()) PairWithBelow(level, m_levels.back());
+        m_levels.push_back(std::move(level));
+        height = 0.0;
     }
-    if (count == 0) return std::nullopt;
-    return byMass && weight > 0.0 ? sum / weight : plain / count;
+    if (!m_error.empty()) m_levels.clear();
+    return m_levels.empty() ? 0 : 1;
 }
 
 int CPostCtrl::GetPushoverStoryDrifts(int loadCase, int step, std::vector<T_STOREY_DRIFT>& out)
 {
-    const auto& storeys = m_data.Model().storeys;
     m_error.clear();
-    if (storeys.empty() || !SelectPushover(loadCase) || !SelectStep(step)) return 0;
+    if (!SelectPushover(loadCase) || !SelectStep(step) || !ReadLevels()) return 0;
     const auto index = static_cast<std::size_t>(step - 1);
-    std::vector<T_STOREY_DRIFT> drifts;
-    double plainBelow = 0.0, centreBelow = 0.0;
-    double height = 0.0; // from the last level that is known
-    for (const auto& [key, storey] : storeys) {
-        height += FromSi(storey.height, m_data.Units(), kDimLength);
-        const auto plain = StoreyMean(storey, index, false, Direction());
-        const auto centre = StoreyMean(storey, index, true, Direction());
-        if (!plain || !centre || !(height > 0.0)) continue;
-        drifts.push_back({key, (*plain - plainBelow) / height, (*centre - centreBelow) / height});
-        plainBelow = *plain;
-        centreBelow = *centre;
-        height = 0.0;
-    }
-    if (!m_error.empty() || drifts.empty()) return 0;
-    out = std::move(drifts);
+    out.clear();
+    for (std::size_t i = 0; i < m_levels.size(); ++i)
+        out.push_back(DriftOf(m_levels[i], i == 0 ? nullptr : &m_levels[i - 1], index));
     return 1;
 }
 

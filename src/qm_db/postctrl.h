@@ -3,6 +3,7 @@
 
 #include "qm_db/results/stagedreader.h"
 #include "qm_db/results/staticreader.h"
+#include "qm_db/results/storeylevels.h"
 
 #include <cstdint>
 #include <map>
@@ -16,13 +17,6 @@ struct T_MPAF_D {
 /// Effective modal masses in per cent of the direction's total.
 struct T_MPAM_D {
     T_DOF6 percent{};
-};
-
-/// Drift ratios of a storey, or of several of which only the top one has results.
-struct T_STOREY_DRIFT {
-    int storey = 0;      // key of the level at the top
-    double plain = 0.0;  // by the mean over the level's nodes
-    double centre = 0.0; // at the level's centre of mass
 };
 
 /// Limit-state steps of the pushover load cases, kept with the model.
@@ -117,11 +111,10 @@ public:
 
     std::string Error() const { return m_error; }
 
-    /// Storey drift ratios of a step, largest over the storeys: kind 1 by the storey's vertical
-    /// node pairs (for curve data the mean over the storey's nodes), kind 2 at the storey's centre
-    /// of mass. Storey drift = |u(i) - u(i-1)| / h(i), the ground being at rest. Nodes without
-    /// results do not count; a storey without any adds its height to the next one. 1 done; 0 no
-    /// storeys or no results, outputs as they were.
+    /// Storey drift ratios of a step, largest over the storeys: kind 1 over the storey's vertical
+    /// node pairs, so that torsion counts, kind 2 at the storey's centre of mass; see DriftOf.
+    /// Nodes without results do not count; a storey without any adds its height to the next one.
+    /// 1 done; 0 no storeys or no results, outputs as they were.
     [[nodiscard]] int GetPushoverStoryDriftRatio(int loadCase, int step, double& kind1,
                                                  double& kind2);
 
@@ -146,8 +139,7 @@ private:
     void ToCurrentUnits(T_DOF6& values, T_DIM linear, T_DIM angular) const;
     int ReadSeries(int node, const std::vector<double>*& out);
     int ReadCurve();
-    std::optional<double> StoreyMean(const T_STOR_D& storey, std::size_t step, bool byMass,
-                                     int direction);
+    int ReadLevels();
     void DeriveParticipation(const T_EIGV_D& mode, T_MPAF_D& factor, T_MPAM_D& percent) const;
     IPushResult* Source() const;
     int Direction() const; // 0 to 5
@@ -166,5 +158,6 @@ private:
     std::uint64_t m_staticRevision = 0; // at that revision of the data
     std::vector<double> m_factors, m_reactions;
     std::map<int, std::vector<double>> m_series;
+    std::vector<T_LEVEL> m_levels; // bottom to top, of the selected pushover
     std::string m_error;
 };

@@ -57,29 +57,31 @@ TEST(PostCtrl, ReadsStepsInCurrentUnits)
     EXPECT_DOUBLE_EQ(-30.0, value);
 }
 
-// Step 1 by hand. Means: 1F 0.016, 2F 0.035; drifts 0.016/3 = 0.0053333, 0.019/4 = 0.00475.
+// Step 1 by hand. Pairs: 1F 0.012/3 and 0.020/3 on the ground, 2F 0.028/4 and 0.010/4.
 // Centres of mass: 1F (1*0.012 + 3*0.020)/4 = 0.018, 2F (4*0.040 + 1*0.030)/5 = 0.038; drifts
-// 0.006 and 0.005. Step 2: means -0.036 and -0.065, drifts 0.012 and 0.00725; centres -0.039 and
-// -0.062, drifts 0.013 and 0.00575.
-TEST(PostCtrl, StoreyDriftIsByMeanAndByCentreOfMass)
+// 0.006 and 0.005. Step 2: pairs 0.010, 0.014, 0.0075, 0.007; centres -0.039 and -0.062, drifts
+// 0.013 and 0.00575.
+TEST(PostCtrl, StoreyDriftIsByNodePairsAndByCentreOfMass)
 {
     CDBDoc doc;
     T_MODEL_CONTENT c = TwoStoreys();
     c.model.styp.units = {FORCE_UNIT::kips, LENGTH_UNIT::in}; // a ratio has no unit
-    const auto expect = [&](int done, int push, int step, double byMean, double byCentre) {
+    const auto expect = [&](int done, int push, int step, double byPair, double byCentre) {
         doc.Data().Assign(c);
         double kind1 = -1.0, kind2 = -1.0;
         EXPECT_EQ(done, doc.Post().GetPushoverStoryDriftRatio(push, step, kind1, kind2)) << step;
-        EXPECT_NEAR(byMean, kind1, 1e-15);
+        EXPECT_NEAR(byPair, kind1, 1e-15);
         EXPECT_NEAR(byCentre, kind2, 1e-15);
     };
-    expect(1, 1, 1, 0.016 / 3, 0.006);
-    expect(1, 1, 2, 0.012, 0.013);
+    expect(1, 1, 1, 0.007, 0.006);
+    expect(1, 1, 2, 0.014, 0.013);
     expect(0, 2, 1, -1.0, -1.0); // no such load case or step
     expect(0, 1, 0, -1.0, -1.0);
     expect(0, 1, 3, -1.0, -1.0);
     c.model.storeys[1].height = 6.0; // now the upper storey governs
-    expect(1, 1, 1, 0.00475, 0.005);
+    expect(1, 1, 1, 0.007, 0.005);
+    c.model.nodes[21].xyz[0] = 2.5; // no node below it: against the mean 0.016 of the storey below
+    expect(1, 1, 1, 0.006, 0.005);
 
     // A storey without results is not one that stands still: the drift is that of the next known
     // level over the height between.
