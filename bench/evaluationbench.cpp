@@ -173,7 +173,8 @@ void AreaPeakSearch(benchmark::State& state)
     const T_TARGET_INPUT input = TargetInput(2000);
     const std::array<double, 3> demands{0.05, 0.1, 0.2};
     for (auto _ : state) {
-        benchmark::DoNotOptimize(CurveArea(input.capacity.View(), 0.4));
+        const T_ADRS_VIEW curve = input.capacity.View();
+        benchmark::DoNotOptimize(AreaTo(curve, FirstPlaceAt(curve, 0.4)));
         benchmark::DoNotOptimize(FindPeakStep(input.capacity.Sa));
         benchmark::DoNotOptimize(FindNearestSteps(input.capacity.Sd, demands));
     }

@@ -157,7 +157,7 @@ EXIT_CODE RunEvaluate(const T_EVALUATE_OPTIONS& o)
     }
     if (IsModelFile(o.file) && !o.noStore && doc.Data().IsModified()) StoreSteps(doc);
     for (const T_PUSH_EVALUATION& e : results) {
-        if (e.result == kPerfPtNone) return EXIT_CODE::NotFound;
+        if (e.Status() != kPerfPtFound && e.Status() != kPerfPtElastic) return EXIT_CODE::NotFound;
     }
     return EXIT_CODE::Done;
 }

@@ -33,12 +33,12 @@ std::string Method(const T_PUSH_EVALUATION& e)
 std::string PointLine(const T_PUSH_EVALUATION& e, int width)
 {
     static constexpr const char* kStatus[] = {"IDS_QM_CLI_NOT_FOUND", "IDS_QM_CLI_FOUND",
-                                              "IDS_QM_CLI_ELASTIC"};
+                                              "IDS_QM_CLI_ELASTIC", "IDS_QM_CLI_BEYOND"};
     const auto value = [&](auto member) {
         return e.point ? Number((*e.point).*member) : std::string("-");
     };
     return FormatText("%-*s %-11s %-10s %11s %11s %11s %10s %9s %9s %6zu\n", width,
-                      e.eval.name.c_str(), Method(e).c_str(), Say(kStatus[e.result]).c_str(),
+                      e.eval.name.c_str(), Method(e).c_str(), Say(kStatus[e.Status()]).c_str(),
                       value(&T_PERF_POINT::D).c_str(), value(&T_PERF_POINT::V).c_str(),
                       value(&T_PERF_POINT::Sd).c_str(), value(&T_PERF_POINT::Sa).c_str(),
                       value(&T_PERF_POINT::Teff).c_str(),
@@ -58,7 +58,7 @@ std::string StateLines(const T_PUSH_EVALUATION& e)
         text +=
             FormatText("  %-6s %12s %6s %12s %6s  %s\n", r.name.c_str(), Number(r.demand).c_str(),
                        Step(r.demandStep).c_str(), Number(r.capacity).c_str(),
-                       Step(r.capacityStep).c_str(), r.remark.empty() ? "-" : r.remark.c_str());
+                       Step(r.capacityStep).c_str(), r.RemarkText().c_str());
     return text;
 }
 

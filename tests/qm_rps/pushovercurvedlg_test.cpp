@@ -78,6 +78,11 @@ void NoMass(T_MODEL& m)
     for (auto& entry : m.nodes)
         entry.second.mass = {};
 }
+/// The control node 3 moves against the others.
+void Against(T_MODEL& m)
+{
+    m.modes[1].shape = {{1, {-1.0}}, {2, {-0.5}}, {3, {0.1}}};
+}
 
 const struct {
     PUSH_METHOD method;
@@ -94,6 +99,8 @@ const struct {
      "IDS_RPS_PO_CURVE_ERROR_EIGEN"},
     {PUSH_METHOD::Atc40, true, OtherMode, PUSH_OUTCOME::ConversionFailed, kNoConversion},
     {PUSH_METHOD::Atc40, false, NoMass, PUSH_OUTCOME::ConversionFailed, kNoConversion},
+    {PUSH_METHOD::Ec8Opcm, false, Against, PUSH_OUTCOME::NegativeGamma,
+     "IDS_QM_ADVICE_NEGATIVE_GAMMA"},
 };
 
 } // namespace
@@ -196,6 +203,7 @@ TEST(PushOverCurveDlg, EveryFailureHasItsOutcomeAndMessage)
 {
     for (const auto& f : kFails) {
         T_MODEL_CONTENT c = Plastic();
+        c.model.poverSteps[1].ec8 = {1, 2, 3};
         f.change(c.model);
         T_EVAL_D eval = Eval(f.method);
         eval.eigenFactors = f.eigen;
@@ -204,7 +212,8 @@ TEST(PushOverCurveDlg, EveryFailureHasItsOutcomeAndMessage)
         EXPECT_EQ(f.outcome, run.R().outcome.code) << f.key;
         EXPECT_TRUE(run.Said(f.key)) << f.key;
         EXPECT_FALSE(run.R().point) << f.key;
-        EXPECT_EQ(std::vector<int>{}, run.Steps(false)) << f.key;
+        const bool target = f.method == PUSH_METHOD::Ec8Opcm; // those of an earlier one go
+        EXPECT_EQ(target ? std::vector{-2, -2, -2} : std::vector{1, 2, 3}, run.Steps(false));
         for (const auto& m : run.R().messages)
             EXPECT_NE(m.key, m.text) << f.key; // every key has a text
     }
@@ -223,7 +232,7 @@ TEST(PushOverCurveDlg, WarnsAndGoesOn)
     EXPECT_EQ(1, run.result);
     EXPECT_TRUE(run.Said("IDS_QM_WARN_DECREASING_DISPLACEMENT"));
     EXPECT_TRUE(run.Said("IDS_QM_WARN_NO_DRIFT"));
-    EXPECT_EQ(1, run.R().limitStates[1].capacityStep); // the peak
+    EXPECT_EQ("not checked", run.R().limitStates[1].remark);
 
     c = Plastic();
     c.model.nodes[1].mass[0] = 0.0;

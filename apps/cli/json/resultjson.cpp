@@ -156,7 +156,7 @@ void Write(CJsonText& w, const T_PUSH_EVALUATION& e)
     w.Member("name", e.eval.name).Member("push", e.eval.push);
     w.Member("method", MethodName(e.eval.method));
     w.Member("procedure", std::string_view(&e.procedure, 1));
-    w.Member("status", StatusName(e.result));
+    w.Member("status", StatusName(e.Status()));
     WriteFactors(w, e);
     w.Key("capacity").Object();
     w.Items("Sd", e.capacity.Sd, kJsonNested).Items("Sa", e.capacity.Sa, kJsonNested);
@@ -179,7 +179,7 @@ void Write(CJsonText& w, const T_PUSH_EVALUATION& e)
 
 const char* StatusName(int result)
 {
-    static constexpr const char* kStatus[] = {"not found", "found", "elastic"};
+    static constexpr const char* kStatus[] = {"not found", "found", "elastic", "beyond the push"};
     return kStatus[result];
 }
 

@@ -2,7 +2,6 @@
 
 #include "qm_rps/pushover/adrsformulas.h"
 #include "qm_rps/pushover/fema440coefficients.h"
-#include "qm_rps/pushover/pushoverbilinear.h"
 #include "qm_rps/pushover/releaseassert.h"
 
 #include <algorithm>
@@ -61,7 +60,7 @@ int CPerfPtOperations::FindFirstSlopeChange(double& D, double& A) const
 
 int CPerfPtOperations::CalcCapacityArea(double d, double& area) const
 {
-    const double sum = CurveArea(Capacity().View(), d);
+    const double sum = m_record.CapacityArea().To(Capacity().View(), d);
     if (!std::isfinite(sum)) return 0;
     area = sum;
     return 1;

@@ -21,8 +21,13 @@ struct T_LIMIT_ROW {
     std::string name;
     std::optional<double> demand, capacity; // MDOF
     std::optional<int> demandStep, capacityStep;
-    std::string remark; // "OK", "N/A", "NG" or empty
+    std::string remark; // "OK", "N/A", "NG", kNotChecked or empty
+    /// As tables show it, in the chosen language; "-" without one.
+    std::string RemarkText() const;
 };
+
+/// Remark of a state whose capacity rests on data that are missing.
+inline constexpr const char* kNotChecked = "not checked";
 
 /// A vertical guide line on the capacity spectrum.
 struct T_GUIDE_LINE {
@@ -86,6 +91,9 @@ struct T_PUSH_EVALUATION {
     T_OUTCOME outcome;
     std::vector<zql::frx::T_MESSAGE> messages;
 
+    /// 0 not found, 1 found, 2 elastic, 3 beyond the push: each demand is larger than the curve's
+    /// largest displacement, so that nothing on the curve belongs to it.
+    int Status() const;
     bool IsTarget() const { return eval.method >= PUSH_METHOD::Ec8Opcm; }
     bool IsMasonry() const
     {

@@ -58,7 +58,8 @@ int CPushEvaluator::SetEvaluation(const T_EVAL_D& evaluation, T_FINDING& refusal
         return 0;
     }
     m_eval = evaluation;
-    m_eval.masonry = evaluation.masonry.value_or(false) || ExistEC8OrMasonry();
+    m_masonryGiven = evaluation.masonry.has_value();
+    m_eval.masonry = evaluation.masonry.value_or(ExistEC8OrMasonry());
     m_spectrumRecord = record;
     m_pushover = pushover;
     SetDamping(DampingOf(evaluation));
@@ -131,6 +132,8 @@ int CPushEvaluator::CheckCurve()
         return Fail(PUSH_OUTCOME::EigenError, "IDS_RPS_PO_CURVE_ERROR_EIGEN");
     if (m_curve.ConversionError())
         return Fail(PUSH_OUTCOME::ConversionFailed, "IDS_QM_NO_CONVERSION");
+    if (m_curve.Factors().gamma < 0.0)
+        return Fail(PUSH_OUTCOME::NegativeGamma, "IDS_QM_ADVICE_NEGATIVE_GAMMA");
     return 1;
 }
 
@@ -152,9 +155,10 @@ int CPushEvaluator::Evaluate()
         m_result.limitStates = CPushOverTargetEvaluation::EmptyRows(m_eval.method);
     SetGravity(FindGravity(false), FindGravity(true));
     PrepareSpectrum();
-    if (CalcPushoverCurve()) {
+    if (CalcPushoverCurve())
         m_result.result = m_result.IsTarget() ? UpdateTargetDispData() : UpdatePerformancePoint();
-    }
+    else
+        ForgetSteps();
     FillResult();
     return m_result.result;
 }
@@ -252,13 +256,19 @@ int CPushEvaluator::UpdateTargetDispData()
     T_TARGET_INPUT input = TargetInput(drift);
     const bool enabled = std::ranges::any_of(
         input.spectra, [](const T_TARGET_SPECTRUM& s) { return static_cast<bool>(s.SaAt); });
-    if (!enabled) return Fail(PUSH_OUTCOME::NoTarget, failed);
+    if (!enabled) {
+        ForgetSteps();
+        return Fail(PUSH_OUTCOME::NoTarget, failed);
+    }
     CPushOverTargetEvaluation evaluation(std::move(input));
     const int found = m_eval.method != PUSH_METHOD::Ec8Opcm
                           ? evaluation.UpdateTargetDispDataNTC(m_eval.method)
                       : m_result.IsMasonry() ? evaluation.UpdateTargetDispDataMasonry()
                                              : evaluation.UpdateTargetDispDataEC8();
     if (!found || evaluation.StrengthDropMissing()) Say(failed);
+    if (m_eval.method == PUSH_METHOD::Ec8Opcm && ExistEC8OrMasonry() &&
+        m_masonryGiven != m_result.IsMasonry())
+        Say(m_masonryGiven ? "IDS_QM_MASONRY_OFF" : "IDS_QM_MASONRY_BY_HINGES");
     if (const char* const key = drift.WarningKey()) Say(key);
     m_result.bilinear = evaluation.Bilinear();
     m_result.targets = evaluation.Targets();
@@ -276,6 +286,17 @@ void CPushEvaluator::StoreSteps(const std::vector<int>& steps)
         info->SetStepEC8(m_pushover, steps[0], steps[1], steps[2]);
     else // SLO is shown but never stored, on purpose
         info->SetStepNTC2008(m_pushover, steps[1], steps[2], steps[3]);
+}
+
+// An evaluation that ended early found none; those of an earlier one don't stand any more.
+void CPushEvaluator::ForgetSteps()
+{
+    if (!m_result.IsTarget() || !m_storeSteps) return;
+    std::array<int, 3> stored{};
+    CPoverInfo* info = m_doc.Post().GetPoverInfo();
+    if (m_eval.method == PUSH_METHOD::Ec8Opcm ? info->GetStepEC8(m_pushover, stored)
+                                              : info->GetStepNTC2008(m_pushover, stored))
+        StoreSteps(std::vector<int>(m_result.limitStates.size(), kStepNone));
 }
 
 void CPushEvaluator::FillResult()

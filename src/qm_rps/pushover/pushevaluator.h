@@ -76,6 +76,7 @@ private:
     T_TARGET_INPUT TargetInput(CStepDrift& drift) const;
     int UpdateTargetDispData();
     void StoreSteps(const std::vector<int>& steps);
+    void ForgetSteps();
     T_PERF_POINT MakePoint(double Dp, double Ap, std::optional<double> beta) const;
     void KeepAllPoints();
     void PrepareSpectrum();
@@ -91,6 +92,7 @@ private:
     CDBDoc& m_doc;
     PERFPT_PROCEDURE m_procedure;
     T_EVAL_D m_eval;
+    bool m_masonryGiven = false; // by the evaluation itself
     T_SPFC_D m_spectrumRecord;
     int m_pushover = 0;
     bool m_storeSteps = true;

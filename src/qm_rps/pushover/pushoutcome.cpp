@@ -1,6 +1,7 @@
 #include "qm_rps/pushover/pushoutcome.h"
 
 #include "qm_base/msgfunction.h"
+#include "qm_base/textformat.h"
 
 #include <array>
 
@@ -13,7 +14,7 @@ struct T_KEYS {
 
 // In the order of PUSH_OUTCOME.
 // clang-format off
-constexpr std::array<T_KEYS, 29> kKeys{{
+constexpr std::array<T_KEYS, 31> kKeys{{
     {"", ""},
     {"IDS_QM_OUTCOME_CONVERGED", "IDS_QM_ADVICE_CONVERGED"},
     {"IDS_QM_OUTCOME_ELASTIC", "IDS_QM_ADVICE_ELASTIC"},
@@ -43,9 +44,11 @@ constexpr std::array<T_KEYS, 29> kKeys{{
     {"IDS_QM_OUTCOME_TARGET_BEYOND", "IDS_QM_ADVICE_TARGET_BEYOND"},
     {"IDS_QM_OUTCOME_NO_TRIAL_POINT", "IDS_QM_ADVICE_TRIAL_BEYOND"},
     {"IDS_QM_OUTCOME_TARGET_BELOW", "IDS_QM_ADVICE_TARGET_BELOW"},
+    {"IDS_QM_OUTCOME_TARGET_CYCLES", "IDS_QM_ADVICE_TARGET_CYCLES"},
+    {"IDS_QM_OUTCOME_NEGATIVE_GAMMA", "IDS_QM_ADVICE_NEGATIVE_GAMMA"},
 }};
 // clang-format on
-static_assert(kKeys.size() == static_cast<std::size_t>(PUSH_OUTCOME::TargetBelow) + 1);
+static_assert(kKeys.size() == static_cast<std::size_t>(PUSH_OUTCOME::NegativeGamma) + 1);
 
 } // namespace
 
@@ -63,5 +66,7 @@ std::string OutcomeName(const T_OUTCOME& outcome)
 std::string OutcomeAdvice(const T_OUTCOME& outcome)
 {
     return zql::lib::MMSGFunction::Format(kKeys[static_cast<std::size_t>(outcome.code)].advice,
-                                          {std::to_string(outcome.count)});
+                                          {std::to_string(outcome.count),
+                                           FormatText("%.6g", outcome.between[0]),
+                                           FormatText("%.6g", outcome.between[1])});
 }

@@ -1,6 +1,7 @@
 // Named outcomes of an evaluation: what happened, beside the return code.
 #pragma once
 
+#include <array>
 #include <string>
 
 enum class PUSH_OUTCOME {
@@ -31,14 +32,17 @@ enum class PUSH_OUTCOME {
     BilinearTooShort,
     ZeroDemand,
     TargetBeyond,
-    TrialBeyond, // no trial point either: the capacity ends before it
-    TargetBelow  // the curve starts beyond the target
+    TrialBeyond,  // no trial point either: the capacity ends before it
+    TargetBelow,  // the curve starts beyond the target
+    TargetCycles, // iterated bilinear curves do not settle
+    NegativeGamma // the control node moves against the mode
 };
 
-/// An outcome with its number, where it has one (trials of a cycle).
+/// An outcome with its numbers, where it has some.
 struct T_OUTCOME {
     PUSH_OUTCOME code = PUSH_OUTCOME::None;
-    int count = 0;
+    int count = 0;                   // trials of a cycle
+    std::array<double, 2> between{}; // targets that do not settle, length
     bool operator==(const T_OUTCOME&) const = default;
 };
 

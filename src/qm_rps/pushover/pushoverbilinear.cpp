@@ -19,13 +19,14 @@ double FirstReach(const T_ADRS_VIEW& c, double level)
     return c.Sd.back();
 }
 
-/// Displacement where the curve has fallen to a level after its peak, else the last one.
-double FirstFall(const T_ADRS_VIEW& c, std::size_t peak, double level)
+/// Where the curve has fallen to a level after its peak, else its last point.
+T_CURVE_PLACE FirstFall(const T_ADRS_VIEW& c, std::size_t peak, double level)
 {
     for (std::size_t i = peak + 1; i < c.Size(); ++i) {
-        if (c.Sa[i] <= level) return At(level, c.Sa[i - 1], c.Sd[i - 1], c.Sa[i], c.Sd[i]);
+        if (c.Sa[i] <= level)
+            return {i - 1, At(level, c.Sa[i - 1], c.Sd[i - 1], c.Sa[i], c.Sd[i]), level};
     }
-    return c.Sd.back();
+    return PlaceAt(c, c.Size() - 1);
 }
 
 std::size_t FirstMaximumOf(std::span<const double> values)
@@ -47,36 +48,38 @@ std::size_t FirstMaximum(const std::vector<double>& Sa)
     return FirstMaximumOf(Sa);
 }
 
-double CurveArea(const T_ADRS_VIEW& c, double d)
+T_CURVE_PLACE PlaceAt(const T_ADRS_VIEW& c, std::size_t point)
 {
-    double sum = 0.0;
+    return {point, c.Sd[point], c.Sa[point]};
+}
+
+T_CURVE_PLACE FirstPlaceAt(const T_ADRS_VIEW& c, double d)
+{
     for (std::size_t i = 0; i + 1 < c.Size(); ++i) {
-        if (d >= c.Sd[i + 1]) {
-            sum += (c.Sa[i] + c.Sa[i + 1]) / 2.0 * (c.Sd[i + 1] - c.Sd[i]);
-        } else if (c.Sd[i] <= d) {
-            const double w = (d - c.Sd[i]) / (c.Sd[i + 1] - c.Sd[i]);
-            const double Sad = c.Sa[i] + w * (c.Sa[i + 1] - c.Sa[i]);
-            sum += (Sad + c.Sa[i]) / 2.0 * (d - c.Sd[i]);
-        }
-        if (c.Sd[i] > d)
-            break; // a curve that turns back ends with the segment that starts beyond d
+        if (c.Sd[i] <= d && d <= c.Sd[i + 1])
+            return {i, d, At(d, c.Sd[i], c.Sa[i], c.Sd[i + 1], c.Sa[i + 1])};
     }
-    return sum;
+    return PlaceAt(c, c.Size() - 1);
 }
 
 double CurveAccelAt(const T_ADRS_VIEW& c, double d)
 {
-    for (std::size_t i = 0; i + 1 < c.Size(); ++i) {
-        if (c.Sd[i] <= d && d <= c.Sd[i + 1])
-            return At(d, c.Sd[i], c.Sa[i], c.Sd[i + 1], c.Sa[i + 1]);
-    }
-    return c.Sa.back();
+    return FirstPlaceAt(c, d).Sa;
 }
 
-int CalcBilinearEc8(const T_ADRS_VIEW& curve, double dm, double ay, T_BILINEAR& out)
+double AreaTo(const T_ADRS_VIEW& c, const T_CURVE_PLACE& place)
 {
-    if (!(ay > 0.0) || !(dm > 0.0)) return 0;
-    const double dy = std::min(2.0 * (dm - CurveArea(curve, dm) / ay), dm);
+    double sum = 0.0;
+    for (std::size_t i = 0; i < place.before; ++i)
+        sum += (c.Sa[i] + c.Sa[i + 1]) / 2.0 * (c.Sd[i + 1] - c.Sd[i]);
+    return sum + (c.Sa[place.before] + place.Sa) / 2.0 * (place.Sd - c.Sd[place.before]);
+}
+
+int CalcBilinearEc8(const T_ADRS_VIEW& curve, const T_CURVE_PLACE& dm, T_BILINEAR& out)
+{
+    const double ay = dm.Sa;
+    if (!(ay > 0.0) || !(dm.Sd > 0.0)) return 0;
+    const double dy = std::min(2.0 * (dm.Sd - AreaTo(curve, dm) / ay), dm.Sd);
     if (!(dy > 0.0)) return 0;
     out = {dy, ay, curve.Sd.back(), ay};
     return 1;
@@ -89,8 +92,9 @@ int CalcBilinearNtc(const T_ADRS_VIEW& curve, const T_BILINEAR_OPTIONS& options,
     const double reach = FirstReach(curve, options.secant * Fbu);
     if (!(Fbu > 0.0) || !(reach > 0.0)) return 0;
     const double k = options.secant * Fbu / reach;
-    const double du = FirstFall(curve, peak, options.drop * Fbu);
-    const double root = du * du - 2.0 * CurveArea(curve, du) / k;
+    const T_CURVE_PLACE end = FirstFall(curve, peak, options.drop * Fbu);
+    const double du = end.Sd;
+    const double root = du * du - 2.0 * AreaTo(curve, end) / k;
     const double ay = root >= 0.0 ? k * (du - std::sqrt(root)) : Fbu;
     if (!(ay > 0.0) || !std::isfinite(ay)) return 0;
     out = {ay / k, ay, du, ay};

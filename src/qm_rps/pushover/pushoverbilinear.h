@@ -25,16 +25,27 @@ T_BILINEAR_OPTIONS BilinearDefaults(BILINEAR_RULE rule);
 /// Index of the first global maximum of the accelerations.
 std::size_t FirstMaximum(const std::vector<double>& Sa);
 
-/// Area under a curve from its first point to d: whole trapezoids up to d, the last one cut.
-double CurveArea(const T_ADRS_VIEW& curve, double d);
-
 /// Sa on a curve at d: of the first segment that holds d, the last ordinate beyond the curve.
 double CurveAccelAt(const T_ADRS_VIEW& curve, double d);
 
-/// EN 1998-1 Annex B.3: equal energy up to dm, yield force = force at dm, which is `ay`. `curve`
+/// A point of a curve that may step back: behind its point `before`, at or before the next one.
+struct T_CURVE_PLACE {
+    std::size_t before = 0;
+    double Sd = 0.0, Sa = 0.0; // length, g
+};
+T_CURVE_PLACE PlaceAt(const T_ADRS_VIEW& curve, std::size_t point);
+/// The first place with the displacement d; the last point where there is none.
+T_CURVE_PLACE FirstPlaceAt(const T_ADRS_VIEW& curve, double d);
+
+/// Area along a curve from its first point to a place, where it steps back negative; what comes
+/// behind the place does not count.
+double AreaTo(const T_ADRS_VIEW& curve, const T_CURVE_PLACE& place);
+
+/// EN 1998-1 Annex B.3: equal energy up to the place of dm, yield force = force there. `curve`
 /// starts at the origin. 1 done; 0 no yield point (no force, or too little energy), output as it
 /// was.
-[[nodiscard]] int CalcBilinearEc8(const T_ADRS_VIEW& curve, double dm, double ay, T_BILINEAR& out);
+[[nodiscard]] int CalcBilinearEc8(const T_ADRS_VIEW& curve, const T_CURVE_PLACE& dm,
+                                  T_BILINEAR& out);
 
 /// NTC C7.3.4.2: secant through a fraction of the peak, equal area to the displacement where the
 /// force has dropped. As above.

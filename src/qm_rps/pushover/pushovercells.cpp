@@ -114,7 +114,7 @@ T_TEXT_TABLE PushoverStateCells(const T_PUSH_EVALUATION& e)
                    {}};
     for (const T_LIMIT_ROW& r : e.limitStates)
         t.rows.push_back({r.name, Number(r.demand), Step(r.demandStep), Number(r.capacity),
-                          Step(r.capacityStep), r.remark.empty() ? "-" : r.remark});
+                          Step(r.capacityStep), r.RemarkText()});
     return t;
 }
 

@@ -24,6 +24,15 @@ constexpr std::array<T_METHOD_ROW, 8> kMethods{{
 }};
 // clang-format on
 
+/// Sa of a curve at Sd, its first ordinate counted from the origin; empty beyond its end.
+std::optional<double> AccelOn(const T_ADRS_CURVE& curve, double Sd)
+{
+    if (curve.Sd.empty() || Sd > *std::ranges::max_element(curve.Sd)) return std::nullopt;
+    const double first = curve.Sd.front();
+    if (Sd < first) return curve.Sa.front() * Sd / first;
+    return CurveAccelAt(curve.View(), Sd);
+}
+
 T_COMPARISON_ROW RowOf(const T_METHOD_ROW& method, const T_PUSH_EVALUATION& e,
                        const CPushEvaluator& evaluator)
 {
@@ -39,10 +48,13 @@ T_COMPARISON_ROW RowOf(const T_METHOD_ROW& method, const T_PUSH_EVALUATION& e,
     }
     for (const T_LIMIT_ROW& state : e.limitStates) {
         if (!method.state || state.name != method.state || !state.demand) continue;
+        const double Sd = e.factors.gamma != 0.0 ? *state.demand / e.factors.gamma : 0.0;
+        const std::optional<double> Sa = AccelOn(e.capacity, Sd);
+        if (!Sa) continue; // beyond the push: no force belongs to it
         row.found = true;
         row.D = *state.demand;
-        row.Sd = e.factors.gamma != 0.0 ? row.D / e.factors.gamma : 0.0;
-        row.Sa = row.V = CurveAccelAt(e.capacity.View(), row.Sd);
+        row.Sd = Sd;
+        row.Sa = row.V = *Sa;
         evaluator.TransferToDispAndReac(nullptr, &row.V);
     }
     return row;

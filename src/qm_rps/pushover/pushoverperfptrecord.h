@@ -6,7 +6,7 @@
 #pragma once
 
 #include "qm_cmd/etc_design_spect.h"
-#include "qm_rps/pushover/curvecrossing.h"
+#include "qm_rps/pushover/curvearea.h"
 #include "qm_rps/pushover/pushoutcome.h"
 
 #include <array>
@@ -80,6 +80,7 @@ public:
     const std::string& ModelPath() const { return m_modelPath; }
 
     const T_ADRS_CURVE& Capacity() const { return m_capacity; }
+    const CCurveArea& CapacityArea() const { return m_capacityArea; }
     /// The driver's 5 %-damped demand spectrum (the record at its own damping) and its periods.
     const T_ADRS_CURVE& Demand() const { return m_demand; }
     const std::vector<double>& DemandPeriods() const { return m_demandT; }
@@ -92,7 +93,11 @@ public:
     std::optional<double> PerfPointTeff() const { return m_perfPointTeff; }
     const std::vector<double>& Teffs() const { return m_teffs; }
 
-    void SetCapacity(T_ADRS_CURVE capacity) { m_capacity = std::move(capacity); }
+    void SetCapacity(T_ADRS_CURVE capacity)
+    {
+        m_capacity = std::move(capacity);
+        m_capacityArea = CCurveArea(m_capacity.View());
+    }
     void SetDamping(const T_DAMP_PARAM& damping) { m_damping = damping; }
     void SetAlphaInPercent(bool on) { m_alphaInPercent = on; }
     /// Gravity in current units: of the model, and the one that serves the evaluation.
@@ -109,6 +114,7 @@ public:
 
 private:
     T_ADRS_CURVE m_capacity, m_demand;
+    CCurveArea m_capacityArea;
     std::vector<double> m_demandT;
     T_DAMP_PARAM m_damping;
     std::unique_ptr<CETC_DESIGN_SPECT> m_spectrum;

@@ -88,7 +88,7 @@ std::string PerfPointSection(const T_PUSH_EVALUATION& e)
 /// A row of the limit-state lines; NTC shows "NG" in the window and "N/A" in the file.
 std::string StateLine(const T_LIMIT_ROW& r)
 {
-    const std::string remark = r.remark.empty() ? "-" : r.remark == "NG" ? "N/A" : r.remark;
+    const std::string remark = r.remark == "NG" ? "N/A" : r.RemarkText();
     return FormatText("* %s- Demand, Capacity, Step, Remark : %s, %s, %s, %s \n", r.name.c_str(),
                       DispText(r.demand).c_str(), DispText(r.capacity).c_str(),
                       StepText(r.demandStep).c_str(), remark.c_str());

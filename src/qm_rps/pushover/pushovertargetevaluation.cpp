@@ -54,25 +54,30 @@ T_TARGET_DISP CPushOverTargetEvaluation::CalcTarget(const T_TARGET_SPECTRUM& spe
 int CPushOverTargetEvaluation::IterateBilinear()
 {
     const T_ADRS_VIEW curve = m_fromOrigin.View();
-    const std::size_t peak = FirstMaximum(m_fromOrigin.Sa);
-    double dm = curve.Sd[peak];
-    if (!FitEc8(dm, curve.Sa[peak])) return 0;
-    while (m_in.options.iterate && m_in.spectra[0].SaAt && m_fits <= kMaxFits) {
+    const double last = *std::ranges::max_element(curve.Sd);
+    T_CURVE_PLACE dm = PlaceAt(curve, FirstMaximum(m_fromOrigin.Sa));
+    if (!FitEc8(dm)) return 0;
+    while (m_in.options.iterate && m_in.spectra[0].SaAt) {
         const T_TARGET_DISP t = CalcTarget(m_in.spectra[0], true);
         if (!t.found) break;
-        const double next = std::min(t.dt, curve.Sd.back());
-        if (std::fabs(next - dm) < kSameDm * std::fabs(next)) break;
+        const T_CURVE_PLACE next = FirstPlaceAt(curve, std::min(t.dt, last));
+        if (std::fabs(next.Sd - dm.Sd) < kSameDm * std::fabs(next.Sd)) break;
+        if (m_fits > kMaxFits) {
+            m_bilinear.reset();
+            m_outcome = {PUSH_OUTCOME::TargetCycles, 0, {dm.Sd, next.Sd}};
+            return 0;
+        }
         dm = next;
-        if (!FitEc8(dm, CurveAccelAt(curve, dm))) return 0;
+        if (!FitEc8(dm)) return 0;
     }
     return 1;
 }
 
-int CPushOverTargetEvaluation::FitEc8(double dm, double ay)
+int CPushOverTargetEvaluation::FitEc8(const T_CURVE_PLACE& dm)
 {
     m_bilinear.reset();
     T_BILINEAR b;
-    if (!CalcBilinearEc8(m_fromOrigin.View(), dm, ay, b)) return 0;
+    if (!CalcBilinearEc8(m_fromOrigin.View(), dm, b)) return 0;
     m_bilinear = b;
     ++m_fits;
     return 1;
@@ -175,7 +180,8 @@ int CPushOverTargetEvaluation::UpdateTargetDispDataCapacity()
     const auto& [d, V] = m_in.capacity;
     const int last = static_cast<int>(d.size()) - 1;
     const int peak = FindPeakStep(V);
-    const int dlStep = FindDriftStep(peak, last, kDamageDrift, m_in.drift).value_or(last);
+    const std::optional<int> driftStep = FindDriftStep(peak, last, kDamageDrift, m_in.drift);
+    const int dlStep = driftStep.value_or(last);
     const double dl = d[static_cast<std::size_t>(dlStep)];
     const auto drop = FindStrengthDrop(d, V, peak, kStrengthLeft * m_bilinear->ay, m_bilinear->du);
     m_noDrop = !drop;
@@ -193,15 +199,16 @@ int CPushOverTargetEvaluation::UpdateTargetDispDataCapacity()
     const std::array<std::pair<double, int>, 4> found{
         {{dl, dlStep}, {sd.d, sd.step}, {0.0, 0}, {dq, dqStep}}};
     for (const std::size_t row : {0U, 1U, 3U}) {
+        if (row == 0 && !driftStep) continue;
         m_rows[row].capacity = m_in.gamma * found[row].first;
         m_rows[row].capacityStep = found[row].second;
     }
-    AddGuide(T_GUIDE_LINE::KIND::Capacity, dl, "DL(Cap.)");
+    if (driftStep) AddGuide(T_GUIDE_LINE::KIND::Capacity, dl, "DL(Cap.)");
     AddGuide(T_GUIDE_LINE::KIND::Capacity, sd.d, "SD(Cap.)");
     AddGuide(T_GUIDE_LINE::KIND::Qstar3, dq, "q*=3(Displ.)");
     if (!m_rows[0].demand) return 1;
     const auto remark = [](bool ok) { return ok ? "OK" : "N/A"; };
-    m_rows[0].remark = remark(*m_rows[0].capacity > *m_rows[0].demand);
+    m_rows[0].remark = driftStep ? remark(*m_rows[0].capacity > *m_rows[0].demand) : kNotChecked;
     m_rows[1].remark =
         remark(std::min(*m_rows[1].capacity, *m_rows[3].capacity) > *m_rows[1].demand);
     return 1;
@@ -228,13 +235,13 @@ int CPushOverTargetEvaluation::UpdateTargetDispDataNTC(PUSH_METHOD code)
     const int last = static_cast<int>(m_in.capacity.Sd.size()) - 1;
     const auto driftStep =
         FindDriftStep(FindPeakStep(m_in.capacity.Sa), last, kSldDrift, m_in.drift);
-    if (driftStep) {
-        m_rows[1].capacityStep = m_rows[2].capacityStep = *driftStep;
-        if (code == PUSH_METHOD::Ntc2008)
-            UpdateTargetDispDataCapacity_NTC2008(*driftStep);
-        else
-            UpdateTargetDispDataCapacity_NTC2018(*driftStep);
-    }
+    if (driftStep) m_rows[1].capacityStep = m_rows[2].capacityStep = *driftStep;
+    for (const std::size_t row : {0U, 1U}) // both follow from the drift
+        if (!driftStep && m_rows[row].demand) m_rows[row].remark = kNotChecked;
+    if (code == PUSH_METHOD::Ntc2018)
+        UpdateTargetDispDataCapacity_NTC2018(driftStep);
+    else if (driftStep)
+        UpdateTargetDispDataCapacity_NTC2008(*driftStep);
     return std::ranges::any_of(m_targets, [](const auto& t) { return t.found; }) ? 1 : 0;
 }
 
@@ -253,15 +260,17 @@ void CPushOverTargetEvaluation::UpdateTargetDispDataCapacity_NTC2008(int driftSt
     SetCapacity(1, sld, "NG");
 }
 
-void CPushOverTargetEvaluation::UpdateTargetDispDataCapacity_NTC2018(int driftStep)
+void CPushOverTargetEvaluation::UpdateTargetDispDataCapacity_NTC2018(std::optional<int> driftStep)
 {
     const auto& [d, V] = m_in.capacity;
-    const double level = 0.75 * V[static_cast<std::size_t>(driftStep)];
-    // No Gamma on the SLD capacity, on purpose.
-    const double sld = std::min(FindRise(d, V, level), m_bilinear->dy);
+    if (driftStep) {
+        const double level = 0.75 * V[static_cast<std::size_t>(*driftStep)];
+        // No Gamma on the SLD capacity, on purpose.
+        const double sld = std::min(FindRise(d, V, level), m_bilinear->dy);
+        SetCapacity(0, 0.67 * sld, "NG");
+        SetCapacity(1, sld, "NG");
+    }
     const double slc = m_in.gamma * m_bilinear->du;
-    SetCapacity(0, 0.67 * sld, "NG");
-    SetCapacity(1, sld, "NG");
     SetCapacity(2, 0.75 * slc, "NG");
     SetCapacity(3, slc, "NG");
 }

@@ -48,7 +48,7 @@ public:
 private:
     int CalcBilinear();
     int IterateBilinear();
-    int FitEc8(double dm, double ay);
+    int FitEc8(const T_CURVE_PLACE& dm);
     T_TARGET_DISP CalcTarget(const T_TARGET_SPECTRUM& spectrum, bool capAt3) const;
     void FindDlSdNcSteps(std::span<const double> demands) { FindSteps(demands); }
     void FindNTC2008Steps(std::span<const double> demands) { FindSteps(demands); }
@@ -56,7 +56,7 @@ private:
     void SetDemand(std::size_t row, double dt);
     int UpdateTargetDispDataCapacity();
     void UpdateTargetDispDataCapacity_NTC2008(int driftStep);
-    void UpdateTargetDispDataCapacity_NTC2018(int driftStep);
+    void UpdateTargetDispDataCapacity_NTC2018(std::optional<int> driftStep);
     void SetCapacity(std::size_t row, double mdof, const char* failing);
     void AddGuide(T_GUIDE_LINE::KIND kind, double Sd, const std::string& label);
     void FinishOutcome();

@@ -34,14 +34,14 @@ std::array<T_TARGET_SPECTRUM, 4> TargetSpectraOf(const T_SPFC_D& record, PUSH_ME
     return spectra;
 }
 
-double CStepDrift::Of(int step)
+std::optional<double> CStepDrift::Of(int step)
 {
     m_used = true;
     if (step == 0) return 0.0;
     double kind1 = 0.0, kind2 = 0.0;
     if (!m_doc.Post().GetPushoverStoryDriftRatio(m_pushover, step, kind1, kind2)) {
         m_missing = true;
-        return 0.0;
+        return std::nullopt;
     }
     return m_kind == 1 ? kind1 : kind2;
 }

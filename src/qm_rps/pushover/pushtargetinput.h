@@ -20,9 +20,8 @@ public:
     {
     }
 
-    /// Ratio of a step; step 0 is the model at rest. Without storeys no drift limits the capacity:
-    /// 0 then, so that the peak step stands.
-    double Of(int step);
+    /// Ratio of a step; step 0 is the model at rest. Empty: it is not known.
+    std::optional<double> Of(int step);
 
     /// Key of the warning that belongs to what was read; null: none.
     const char* WarningKey();

@@ -1,6 +1,7 @@
 // By hand; examples/verification holds the published N2 cases.
 #include "qm_rps/pushover/pushovertargetevaluation.h"
 
+#include <algorithm>
 #include <cmath>
 #include <gtest/gtest.h>
 #include <numbers>
@@ -170,4 +171,40 @@ TEST(TargetEvaluation, Ntc2018TakesTheSmallerOfRiseAndYield)
     const double dy = 0.1 - std::sqrt(0.01 - 0.00235);
     EXPECT_NEAR(dy, e.Rows()[1].capacity.value(), 1e-15);
     EXPECT_EQ("OK", e.Rows()[1].remark); // demand 1.5 * 0.0025
+}
+
+TEST(TargetEvaluation, WithoutDriftsNothingThatRestsOnThemIsChecked)
+{
+    T_TARGET_INPUT in = Input(BILINEAR_RULE::Ntc, kSmallDrifts);
+    in.drift = [](int) { return std::nullopt; };
+    in.spectra.fill(Constant(0.1, 0.1));
+    CPushOverTargetEvaluation ntc(in);
+    ASSERT_EQ(1, ntc.UpdateTargetDispDataNTC(PUSH_METHOD::Ntc2018));
+    in.options = BilinearDefaults(BILINEAR_RULE::Masonry);
+    CPushOverTargetEvaluation masonry(in);
+    ASSERT_EQ(1, masonry.UpdateTargetDispDataMasonry());
+    for (const T_LIMIT_ROW& row : {ntc.Rows()[0], ntc.Rows()[1], masonry.Rows()[0]}) {
+        EXPECT_EQ("not checked", row.remark) << row.name;
+        EXPECT_FALSE(row.capacity.has_value() || row.capacityStep.has_value()) << row.name;
+    }
+    EXPECT_EQ("OK", ntc.Rows()[3].remark); // the end of the bilinear curve
+    EXPECT_EQ("OK", masonry.Rows()[1].remark);
+}
+
+// Up to 0.01 the curve is soft (T* 0.9 s), up to 0.02 stiff (0.4 s, dy limited to dm). The spectrum
+// asks 0.02 of the soft one and 0.01 of the stiff one: each answer asks for the other.
+TEST(TargetEvaluation, AnIterationThatDoesNotSettleHasNoTarget)
+{
+    T_TARGET_INPUT in = Input(BILINEAR_RULE::Ec8, kSmallDrifts);
+    in.capacity = {{0.001, 0.01, 0.02}, {0.005, 0.05, 0.5}};
+    in.options.iterate = true;
+    in.spectra[0] = {
+        [](double T) { return (T > 0.6 ? 0.02 : 0.01) * 4 * kPi * kPi / (T * T * 10); }, 0.1};
+    CPushOverTargetEvaluation e(in);
+    EXPECT_EQ(0, e.UpdateTargetDispDataEC8());
+    EXPECT_EQ(PUSH_OUTCOME::TargetCycles, e.Outcome().code);
+    const auto [low, high] = std::minmax(e.Outcome().between[0], e.Outcome().between[1]);
+    EXPECT_NEAR(0.01, low, 1e-12);
+    EXPECT_NEAR(0.02, high, 1e-12);
+    EXPECT_FALSE(e.Rows()[1].demand.has_value());
 }
