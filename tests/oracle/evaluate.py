@@ -114,6 +114,12 @@ def first_crossing_of_segment(p1, p2, xs, ys):
     return None
 
 
+def area_along(xs, ys, i, x, y):
+    """Trapezoidal area along the curve to its point i and on to (x, y)."""
+    whole = sum((ys[k] + ys[k + 1]) / 2.0 * (xs[k + 1] - xs[k]) for k in range(i))
+    return whole + (ys[i] + y) / 2.0 * (x - xs[i])
+
+
 def area_to(d, xs, ys):
     """Trapezoidal area from the first point of the curve to displacement d."""
     area = 0.0
@@ -291,12 +297,24 @@ class Case:
         return out
 
     def drift(self, push, step, kind, d):
-        """Largest storey drift ratio of a step (1 = first analysis step)."""
+        """Largest storey drift ratio of a step (1 = first analysis step); None: no storeys.
+
+        Kind 1: each node against the one under it in plan, else against the mean below."""
         table = push["steps"]["displacement"]
-        below, worst = 0.0, 0.0
+        below, worst, under = 0.0, 0.0, []
         for s in self.storeys:
             nodes = [n for n in s["nodes"] if str(n) in table]
             u = [table[str(n)][step - 1] for n in nodes]
+            if kind == 1:
+                plan = [self.nodes[n]["xyz"][:2] for n in nodes]
+                for p, top in zip(plan, u):
+                    near = [(math.dist(p, q), foot) for q, foot in under]
+                    near = [pair for pair in near if pair[0] <= 0.01 * s["height"]]
+                    foot = min(near)[1] if near else below
+                    worst = max(worst, abs(top - foot) / s["height"])
+                under = list(zip(plan, u))
+                below = sum(u) / len(u) if u else below
+                continue
             w = [1.0] * len(u)
             if kind == 2:
                 w = [self.nodes[n].get("mass", [0.0] * 3)[d] for n in nodes]
@@ -305,7 +323,7 @@ class Case:
             here = sum(a * b for a, b in zip(u, w)) / sum(w) if u else below
             worst = max(worst, abs(here - below) / s["height"])
             below = here
-        return worst
+        return worst if self.storeys else None
 
 
 class Curve:
@@ -336,6 +354,8 @@ class Curve:
             scale = abs(self.M) if kind == 1 else abs(self.M * self.alpha) / self.gamma
         if self.error is None and (self.gamma == 0.0 or scale == 0.0):
             self.error = "transformation factor or force scale is zero"
+        if self.error is None and self.gamma < 0.0:
+            self.error = "control node moves against the mode"
         self.assemble()
 
     def choose_mode(self, kind):
@@ -746,19 +766,20 @@ class Target:
 
     def bilinear_peak(self):
         """Starting point of EN 1998-1 Annex B: dm at the first maximum of the curve."""
-        top = max(self.ys)
-        dm = self.xs[self.ys.index(top)]
-        self.bilinear_ec8(dm, top)
-        return dm
+        i = self.ys.index(max(self.ys))
+        self.bilinear_ec8(self.xs[i], i)
+        return self.xs[i]
 
-    def bilinear_ec8(self, dm, at=None):
+    def bilinear_ec8(self, dm, i=None):
         """EN 1998-1 Annex B.3: equal energy up to dm, yield force = force at dm."""
-        if at is None:
-            hit = vertical_crossing(dm, self.xs, self.ys)
-            if not hit:
+        xs, ys = self.xs, self.ys
+        at = ys[i] if i is not None else None
+        if i is None:
+            i = next((k for k in range(len(xs) - 1) if xs[k] <= dm <= xs[k + 1]), None)
+            if i is None:
                 raise Fail("bilinear: displacement beyond the curve")
-            at = hit[1]
-        dy = min(dm, 2.0 * (dm - div(area_to(dm, self.xs, self.ys), at)))
+            at = ys[i] + (ys[i + 1] - ys[i]) * div(dm - xs[i], xs[i + 1] - xs[i])
+        dy = min(dm, 2.0 * (dm - div(area_along(xs, ys, i, dm, at), at)))
         self.set_bilinear(dy, at, self.xs[-1])
 
     def bilinear_ntc(self):
@@ -771,12 +792,13 @@ class Target:
         want = self.secant * top
         i = next(i for i in range(len(ys) - 1) if ys[i + 1] >= want)
         k = div(want, xs[i] + (xs[i + 1] - xs[i]) * div(want - ys[i], ys[i + 1] - ys[i]))
-        fall, du = self.drop * top, xs[-1]
+        fall, du, end = self.drop * top, xs[-1], (len(xs) - 1, ys[-1])
         for i in range(peak, len(ys) - 1):
             if ys[i + 1] <= fall:
                 du = xs[i] + (xs[i + 1] - xs[i]) * div(ys[i] - fall, ys[i] - ys[i + 1])
+                end = (i, fall)
                 break
-        inner = du * du - 2.0 * area_to(du, xs, ys) / k
+        inner = du * du - 2.0 * area_along(xs, ys, end[0], du, end[1]) / k
         ay = k * (du - math.sqrt(inner)) if inner >= 0.0 else top
         self.set_bilinear(ay / k, ay, du)
 
@@ -833,6 +855,8 @@ class Target:
         def drift(s):
             return self.case.drift(self.c.push, s, self.kind, self.c.dir) if s > 0 else 0.0
         peak = self.peak()
+        if drift(peak) is None:
+            return None
         if drift(peak) <= limit:
             return peak
         step, away = len(self.d) - 1, abs(1.0 - limit)
@@ -848,10 +872,12 @@ class Target:
         if self.rule == "ec8":
             dm = self.bilinear_peak()
             if self.iterate:
-                for _ in range(50):
-                    new = min(self.target(spectrum, True)[2], self.xs[-1])
+                for fits in range(1, 52):
+                    new = min(self.target(spectrum, True)[2], max(self.xs))
                     if abs(new - dm) < 1e-6 * abs(new):
                         break
+                    if fits == 51:
+                        raise Fail("target displacement does not settle")
                     dm = new
                     self.bilinear_ec8(dm)
         else:
@@ -875,7 +901,7 @@ class Target:
         d, V, last = self.d, self.V, len(self.d) - 1
         peak = self.peak()
         dl_step = self.drift_step(0.003)
-        dl = d[dl_step]
+        dl = d[last if dl_step is None else dl_step]
         sd, sd_step, limit = d[last], last, 0.8 * self.ay
         for i in range(peak, last):
             if compare(d[i], self.du) < 0:
@@ -897,12 +923,14 @@ class Target:
             if self.tstar < spectrum.tc:
                 dq = (elastic / q) * (1.0 + (q - 1.0) * spectrum.tc / self.tstar)
             dq_step = self.nearest(dq, last)
-        caps = ((dl, dl_step), (sd, sd_step), None, (dq, dq_step))
+        caps = (None if dl_step is None else (dl, dl_step), (sd, sd_step), None, (dq, dq_step))
         for row, cap in zip(rows, caps):
             if cap:
                 row["capacity"], row["capacity_step"] = self.gamma * cap[0], cap[1]
         if rows[0]["demand"] is not None:
-            rows[0]["remark"] = "OK" if rows[0]["capacity"] > rows[0]["demand"] else "N/A"
+            rows[0]["remark"] = "not checked"
+            if dl_step is not None:
+                rows[0]["remark"] = "OK" if rows[0]["capacity"] > rows[0]["demand"] else "N/A"
             good = min(rows[1]["capacity"], rows[3]["capacity"]) > rows[1]["demand"]
             rows[1]["remark"] = "OK" if good else "N/A"
 
@@ -938,7 +966,13 @@ class Target:
         d, V = self.d, self.V
         step = self.drift_step(0.005)
         rows[1]["capacity_step"] = rows[2]["capacity_step"] = step
-        if new:
+        if step is None:
+            slc = self.gamma * self.du
+            caps = (None, None) + ((0.75 * slc, slc) if new else (None, None))
+            for row in rows[:2]:
+                if row["demand"] is not None:
+                    row["remark"] = "not checked"
+        elif new:
             limit, at = 0.75 * V[step], 0.0
             for k in range(1, len(V)):
                 if V[k - 1] <= limit < V[k]:
@@ -1012,7 +1046,10 @@ def evaluate(case, ev):
             t = Target(curve, case, rec, ev)
             res = t.ec8() if method == "EC8/OPCM" else t.ntc(method == "NTC2018")
             out["target"], out["limit_states"], ok, out["outcome"]["name"] = res
-            out["status"] = "found" if ok else "not found"
+            last = abs(curve.gamma) * max(t.d)
+            reached = any(r["demand"] is not None and abs(r["demand"]) <= last
+                          for r in out["limit_states"])
+            out["status"] = "not found" if not ok else "found" if reached else "beyond the push"
     except Fail as e:
         out["outcome"]["name"] = str(e)
     if solver:

@@ -213,7 +213,7 @@ TEST(PushOverCurveDlg, EveryFailureHasItsOutcomeAndMessage)
         EXPECT_TRUE(run.Said(f.key)) << f.key;
         EXPECT_FALSE(run.R().point) << f.key;
         const bool target = f.method == PUSH_METHOD::Ec8Opcm; // those of an earlier one go
-        EXPECT_EQ(target ? std::vector{-2, -2, -2} : std::vector{1, 2, 3}, run.Steps(false));
+        EXPECT_EQ(target ? -2 : 3, run.Steps(false).back()) << f.key;
         for (const auto& m : run.R().messages)
             EXPECT_NE(m.key, m.text) << f.key; // every key has a text
     }
