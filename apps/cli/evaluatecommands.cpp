@@ -64,6 +64,7 @@ EXIT_CODE EvaluateAll(CDBDoc& doc, const T_EVALUATE_OPTIONS& options,
     return Complain(EXIT_CODE::Usage, doc.Path() + ": " + Say("IDS_QM_CLI_NO_EVALUATION", only));
 }
 
+#ifdef QM_UI
 /// The path itself for one evaluation; for several a number before the extension.
 std::string NumberedPath(const std::string& path, std::size_t index, std::size_t count)
 {
@@ -71,6 +72,7 @@ std::string NumberedPath(const std::string& path, std::size_t index, std::size_t
     const std::string stem = CFileCtrl::GetFilePathAndNameWithoutExtension(path);
     return stem + "-" + std::to_string(index + 1) + path.substr(stem.size());
 }
+#endif
 
 EXIT_CODE WritePlots(const std::string& path, const std::vector<T_PUSH_EVALUATION>& results)
 {
