@@ -335,8 +335,7 @@ void CPlotLayout::PlaceLegend(const T_PLOT_VIEW& view, CPlotSpace& space, T_PLOT
     }
     if (legend.entries.empty()) return;
     const double extra = kLegendSample + 3 * kLegendPad;
-    const double room = out.area.w - 2 * CPlotSpace::kInset - extra;
-    nameW = std::min(nameW + 2.0, room); // longer names are cut when drawn
+    nameW = std::min(nameW + 2.0, 0.6 * out.area.w - extra); // longer names are cut when drawn
     legend.rowHeight = 1.15 * RowHeight(kTextPx);
     legend.columnWidth = nameW + kLegendSample + 2 * kLegendPad;
     const double perColumn = std::max(1.0, std::floor(0.6 * out.area.h / legend.rowHeight));

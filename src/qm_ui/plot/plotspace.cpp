@@ -130,6 +130,7 @@ double CPlotSpace::Hidden(const T_PLOT_BOX& box) const
 std::optional<T_PLOT_BOX> CPlotSpace::PlaceAnywhere(double w, double h)
 {
     constexpr int kGrid = 24;
+    constexpr double kInset = 10.0;      // px from the frame
     constexpr double kCornerCost = 0.05; // per px from the nearest corner
     T_BEST best;
     const double freeW = m_area.w - w - 2 * kInset;

@@ -22,8 +22,6 @@ class CPlotSpace {
 public:
     explicit CPlotSpace(const T_PLOT_BOX& area);
 
-    static constexpr double kInset = 10.0; // px from the frame that PlaceAnywhere keeps
-
     /// What a box would hide: the weight of each cell (4 x 4 px) that the line or the point
     /// touches; the heaviest thing in a cell counts.
     void MarkLine(T_PLOT_PX a, T_PLOT_PX b, double weight);
