@@ -39,6 +39,7 @@ CAxialForceList::CAxialForceList(const std::vector<T_SKEL_AXIAL>& curves) : m_gi
 std::vector<T_SKEL_AXIAL> CAxialForceList::Curves(const T_SIDES<T_SKEL_SIDE>& fresh) const
 {
     std::vector<T_SKEL_AXIAL> curves;
+    curves.reserve(m_rows.size());
     for (const T_ROW& r : m_rows)
         curves.push_back(
             {r.axial, r.source < 0 ? fresh : m_given[static_cast<std::size_t>(r.source)].sides});
