@@ -266,8 +266,7 @@ int CPushEvaluator::UpdateTargetDispData()
                       : m_result.IsMasonry() ? evaluation.UpdateTargetDispDataMasonry()
                                              : evaluation.UpdateTargetDispDataEC8();
     if (!found || evaluation.StrengthDropMissing()) Say(failed);
-    if (m_eval.method == PUSH_METHOD::Ec8Opcm && ExistEC8OrMasonry() &&
-        m_masonryGiven != m_result.IsMasonry())
+    if (ExistEC8OrMasonry() && m_masonryGiven != m_eval.masonry.value_or(false)) // NTC's rule too
         Say(m_masonryGiven ? "IDS_QM_MASONRY_OFF" : "IDS_QM_MASONRY_BY_HINGES");
     if (const char* const key = drift.WarningKey()) Say(key);
     m_result.bilinear = evaluation.Bilinear();

@@ -62,6 +62,7 @@ const T_FIT kFits[] = {
     { "ec8, steps back behind",    kBack, kEc8, 0.1, {0.04, 50, 0.14, 50} },
     // Falls to 42.5 at 0.09, stepping back; area 4 - 0.01 (50 + 42.5)/2; 30 at 0.015.
     { "ntc, steps back",           kBack, kNtc, 0.0, Ntc(2000, 0.09, 3.5375) },
+    { "masonry, steps back",       kBack, kMasonry, 0.0, Ntc(2000, 0.26 / 3, 3.4) }, // 40; 35
     // k = 0.6, area 0.025 + 0.495 + 0.08 = 0.6 > k du2/2: no real root, the peak is taken.
     { "ntc, no root",              kKnuckle, kNtc, 0.0, {1.0 / 0.6, 1.0, 1.1, 1.0} },
 };
