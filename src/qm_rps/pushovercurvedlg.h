@@ -22,6 +22,8 @@ public:
     /// elastic; Result is filled in every case.
     int Evaluate();
     const T_PUSH_EVALUATION& Result() const { return m_evaluator.Result(); }
+    /// Whether an evaluation that doesn't say is one of masonry in this model.
+    bool ExistEC8OrMasonry() const { return m_evaluator.ExistEC8OrMasonry(); }
 
     /// Whether limit-state steps are stored in the model (the default).
     void SetStoreSteps(bool store) { m_evaluator.SetStoreSteps(store); }

@@ -79,6 +79,8 @@ public:
     void SayNotWritten(const std::string& why) { ShowMessage("IDS_QM_UI_FILE_REFUSED", why); }
 
     // ---- what is on show ----
+    /// Whether the settings are of masonry: as they say, else as the hinge types of the model do.
+    bool IsMasonry() const { return m_settings.masonry.value_or(m_driver.ExistEC8OrMasonry()); }
     CShownEvaluation& Shown() { return m_shown; }
     const CShownEvaluation& Shown() const { return m_shown; }
     const std::vector<T_FINDING>& Findings() const { return m_findings; }

@@ -261,3 +261,15 @@ TEST(PushOverCurveDlg, GravityOfSpectrumThenModelThenStandard)
     run.doc.Data().Assign(c);
     EXPECT_DOUBLE_EQ(9806.65, run.dlg.GetGravity(1));
 }
+
+TEST(PushOverCurveDlg, AnAnswerOnMasonryHoldsAgainstTheHingeTypes)
+{
+    T_MODEL_CONTENT c = Plastic();
+    c.model.hingeTypes[1].masonry = T_MASONRY_HINGE{};
+    T_EVAL_D eval = Eval(PUSH_METHOD::Ec8Opcm);
+    const T_RUN open(c, eval);
+    EXPECT_TRUE(open.R().IsMasonry() && open.Said("IDS_QM_MASONRY_BY_HINGES"));
+    eval.masonry = false;
+    const T_RUN answered(c, eval);
+    EXPECT_TRUE(!answered.R().IsMasonry() && answered.Said("IDS_QM_MASONRY_OFF"));
+}

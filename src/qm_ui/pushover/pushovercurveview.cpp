@@ -110,7 +110,11 @@ void BuildDamping(CFormView& form, MODEL& m)
         KeyTexts({"IDS_QM_UI_PUSH_DRIFT_1", "IDS_QM_UI_PUSH_DRIFT_2"}));
     drift.name = "driftKind";
     drift.shown = [&m] { return m.m_methodPage.IsTarget(); };
-    auto& masonry = form.Flag(KeyText("IDS_QM_UI_PUSH_MASONRY"), OrDefault(s.masonry, false));
+    auto& masonry = form.Flag(KeyText("IDS_QM_UI_PUSH_MASONRY"), {[&m] { return m.IsMasonry(); },
+                                                                  [&m, &s](const bool& on) {
+                                                                      if (on != m.IsMasonry())
+                                                                          s.masonry = on;
+                                                                  }});
     masonry.name = "masonry";
     masonry.shown = [&m] { return m.m_settings.method == PUSH_METHOD::Ec8Opcm; };
 }
