@@ -122,6 +122,13 @@ EXIT_CODE Analyse(CDBDoc& doc, const std::vector<int>& cases, int modes, bool no
 EXIT_CODE RunAnalyse(const T_ANALYSE_OPTIONS& o)
 {
     if (const EXIT_CODE code = CheckPlotName(o.plot); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = CheckOutputs(o.file,
+                                            {{o.json, OUTPUT_KIND::Json},
+                                             {o.plot, OUTPUT_KIND::Picture},
+                                             {o.out, OUTPUT_KIND::Document}},
+                                            o.overwrite);
+        code != EXIT_CODE::Done)
+        return code;
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     T_SHOWN shown;

@@ -20,6 +20,7 @@ struct T_ANALYSE_OPTIONS {
     std::string plotCase;           // its load case or combination; empty: the first one shown
     int plotMode = 0;               // a mode in place of a load case
     std::string out;                // write the model with its results here
+    bool overwrite = false;         // files that are there
     bool noStore = false;           // don't store the results in a model file
 };
 

@@ -3,7 +3,6 @@
 #include "inputfile.h"
 #include "output.h"
 #include "qm_base/say.h"
-#include "qm_db/filectrl.h"
 #include "qm_rps/pushover/pushovercomparison.h"
 #include "qm_rps/pushover/pushoverreport.h"
 #include "qm_rps/pushovercalculators.h"
@@ -64,7 +63,6 @@ EXIT_CODE EvaluateAll(CDBDoc& doc, const T_EVALUATE_OPTIONS& options,
     return Complain(EXIT_CODE::Usage, doc.Path() + ": " + Say("IDS_QM_CLI_NO_EVALUATION", only));
 }
 
-#ifdef QM_UI
 /// The path itself for one evaluation; for several a number before the extension.
 std::string NumberedPath(const std::string& path, std::size_t index, std::size_t count)
 {
@@ -72,7 +70,16 @@ std::string NumberedPath(const std::string& path, std::size_t index, std::size_t
     const std::string stem = CFileCtrl::GetFilePathAndNameWithoutExtension(path);
     return stem + "-" + std::to_string(index + 1) + path.substr(stem.size());
 }
-#endif
+
+/// Where the results of so many evaluations go.
+std::vector<T_OUTPUT> OutputsOf(const T_EVALUATE_OPTIONS& o, std::size_t count)
+{
+    std::vector<T_OUTPUT> outputs{
+        {o.json, OUTPUT_KIND::Json}, {o.report, OUTPUT_KIND::Text}, {o.curve, OUTPUT_KIND::Text}};
+    for (std::size_t i = 0; i < count && !o.plot.empty(); ++i)
+        outputs.push_back({NumberedPath(o.plot, i, count), OUTPUT_KIND::Picture});
+    return outputs;
+}
 
 EXIT_CODE WritePlots(const std::string& path, const std::vector<T_PUSH_EVALUATION>& results)
 {
@@ -125,6 +132,10 @@ EXIT_CODE WriteResults(const T_EVALUATE_OPTIONS& o, const std::vector<T_PUSH_EVA
 EXIT_CODE RunCompare(const T_COMPARE_OPTIONS& o)
 {
     if (const EXIT_CODE code = CheckPlotName(o.plot); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = CheckOutputs(
+            o.file, {{o.json, OUTPUT_KIND::Json}, {o.plot, OUTPUT_KIND::Picture}}, o.overwrite);
+        code != EXIT_CODE::Done)
+        return code;
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     T_PUSH_COMPARISON comparison;
@@ -149,6 +160,11 @@ EXIT_CODE RunEvaluate(const T_EVALUATE_OPTIONS& o)
     if (const EXIT_CODE code = CheckPlotName(o.plot); code != EXIT_CODE::Done) return code;
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
+    const auto& evaluations = doc.Data().Model().evaluations;
+    const std::size_t count = o.only.empty() ? evaluations.size() : 1;
+    if (const EXIT_CODE code = CheckOutputs(o.file, OutputsOf(o, count), o.overwrite);
+        code != EXIT_CODE::Done)
+        return code;
     std::vector<T_PUSH_EVALUATION> results;
     if (const EXIT_CODE code = EvaluateAll(doc, o, results); code != EXIT_CODE::Done) return code;
     if (const EXIT_CODE code = WriteResults(o, results); code != EXIT_CODE::Done) return code;

@@ -16,7 +16,8 @@ struct T_EVALUATE_OPTIONS {
     std::vector<int> steps;           // additional steps to list
     std::vector<std::string> spectra; // additional spectra for performance points
     bool trace = false;
-    bool noStore = false; // don't store the limit-state steps in a model file
+    bool overwrite = false; // files that are there
+    bool noStore = false;   // don't store the limit-state steps in a model file
 };
 
 struct T_COMPARE_OPTIONS {
@@ -26,6 +27,7 @@ struct T_COMPARE_OPTIONS {
     int behavior = 0;
     std::string json; // file, or "-"
     std::string plot; // .svg, .png or .pdf
+    bool overwrite = false;
 };
 
 EXIT_CODE RunCompare(const T_COMPARE_OPTIONS& options);

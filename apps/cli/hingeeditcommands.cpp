@@ -45,7 +45,9 @@ EXIT_CODE RunHingeConvert(const T_HINGE_OPTIONS& o)
     CDBDoc doc;
     int key = 0;
     T_PHGT_D type;
-    if (const EXIT_CODE code = OpenType(doc, o, key, type); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = OpenType(doc, o, OUTPUT_KIND::Document, key, type);
+        code != EXIT_CODE::Done)
+        return code;
     const SKEL_MEASURE to = o.to == "plastic" ? SKEL_MEASURE::Plastic : SKEL_MEASURE::DDy;
     int switched = 0;
     bool noYield = false; // a switch without a yield deformation would make every value 0
@@ -75,7 +77,9 @@ EXIT_CODE RunHingeAxial(const T_HINGE_OPTIONS& o)
     CDBDoc doc;
     int key = 0;
     T_PHGT_D type;
-    if (const EXIT_CODE code = OpenType(doc, o, key, type); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = OpenType(doc, o, OUTPUT_KIND::Document, key, type);
+        code != EXIT_CODE::Done)
+        return code;
     const auto component = ComponentOf(o.component);
     HINGE_END page{};
     T_SKEL_CURVE* curve =
@@ -104,7 +108,9 @@ EXIT_CODE RunHingePlot(const T_HINGE_OPTIONS& o)
     CDBDoc doc;
     int key = 0;
     T_PHGT_D type;
-    if (const EXIT_CODE code = OpenType(doc, o, key, type); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = OpenType(doc, o, OUTPUT_KIND::Picture, key, type);
+        code != EXIT_CODE::Done)
+        return code;
 #ifdef QM_UI
     T_PLOT plot;
     if (o.interaction) {

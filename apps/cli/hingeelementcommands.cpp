@@ -147,7 +147,9 @@ EXIT_CODE RunHingeAssign(const T_HINGE_OPTIONS& o)
     CDBDoc doc;
     int key = 0;
     T_PHGT_D type;
-    if (const EXIT_CODE code = OpenType(doc, o, key, type); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = OpenType(doc, o, OUTPUT_KIND::Document, key, type);
+        code != EXIT_CODE::Done)
+        return code;
     const std::optional<std::vector<int>> elements = ParseElementList(o.elements);
     if (!elements || elements->empty())
         return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_ELEMENT_LIST", o.elements));

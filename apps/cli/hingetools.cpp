@@ -27,8 +27,12 @@ void PrintLine(const std::string& text)
     std::printf("%s\n", text.c_str());
 }
 
-EXIT_CODE OpenType(CDBDoc& doc, const T_HINGE_OPTIONS& o, int& key, T_PHGT_D& type)
+EXIT_CODE OpenType(CDBDoc& doc, const T_HINGE_OPTIONS& o, OUTPUT_KIND kind, int& key,
+                   T_PHGT_D& type)
 {
+    if (const EXIT_CODE code = CheckOutputs(o.file, {{o.out, kind}}, o.overwrite);
+        code != EXIT_CODE::Done)
+        return code;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     if (doc.Attr().FindPhgt(o.type, key) && doc.Attr().GetPhgt(key, type)) return EXIT_CODE::Done;
     return NoSuchType(doc.Path(), o.type);

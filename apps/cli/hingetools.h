@@ -34,8 +34,10 @@ std::string EndName(HINGE_END end);
 /// Prints one line.
 void PrintLine(const std::string& text);
 
-/// Opens the document and takes the type of that name with its key.
-EXIT_CODE OpenType(CDBDoc& doc, const T_HINGE_OPTIONS& o, int& key, T_PHGT_D& type);
+/// Opens the document and takes the type of that name with its key, for a command that writes an
+/// output of this kind.
+EXIT_CODE OpenType(CDBDoc& doc, const T_HINGE_OPTIONS& o, OUTPUT_KIND kind, int& key,
+                   T_PHGT_D& type);
 
 /// The curve of the page that the options name, or null.
 T_SKEL_CURVE* PageOf(T_HINGE_COMPONENT& component, const std::string& end, HINGE_END& page);

@@ -10,7 +10,16 @@ bool IsModelFile(const std::string& path)
 EXIT_CODE ReportFileError(const T_FILE_ERROR& error)
 {
     std::fprintf(stderr, "qm-rps: %s\n", error.text.c_str());
-    return error.fault == FILE_FAULT::NoAccess ? EXIT_CODE::NoAccess : EXIT_CODE::BadInput;
+    switch (error.fault) {
+    case FILE_FAULT::NoAccess:
+        return EXIT_CODE::NoAccess;
+    case FILE_FAULT::Misuse:
+        return EXIT_CODE::Usage;
+    case FILE_FAULT::BadInput:
+    case FILE_FAULT::None:
+        break;
+    }
+    return EXIT_CODE::BadInput;
 }
 
 EXIT_CODE OpenInput(CDBDoc& doc, const std::string& path)

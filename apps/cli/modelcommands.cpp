@@ -54,8 +54,11 @@ std::string InfoText(CDBDoc& doc)
 
 } // namespace
 
-EXIT_CODE RunImport(const std::string& caseFile, const std::string& modelFile)
+EXIT_CODE RunImport(const std::string& caseFile, const std::string& modelFile, bool overwrite)
 {
+    if (const EXIT_CODE code = CheckOutputs(caseFile, {{modelFile, OUTPUT_KIND::Model}}, overwrite);
+        code != EXIT_CODE::Done)
+        return code;
     CDBDoc doc;
     T_FILE_ERROR error;
     if (!doc.ImportCase(caseFile, error)) return ReportFileError(error);
@@ -64,8 +67,11 @@ EXIT_CODE RunImport(const std::string& caseFile, const std::string& modelFile)
     return EXIT_CODE::Done;
 }
 
-EXIT_CODE RunExport(const std::string& modelFile, const std::string& caseFile)
+EXIT_CODE RunExport(const std::string& modelFile, const std::string& caseFile, bool overwrite)
 {
+    if (const EXIT_CODE code = CheckOutputs(modelFile, {{caseFile, OUTPUT_KIND::Json}}, overwrite);
+        code != EXIT_CODE::Done)
+        return code;
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, modelFile); code != EXIT_CODE::Done) return code;
     T_FILE_ERROR error;

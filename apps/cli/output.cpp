@@ -2,7 +2,6 @@
 
 #include "inputfile.h"
 #include "qm_base/say.h"
-#include "qm_db/filectrl.h"
 
 #ifdef QM_UI
 #include "qm_ui/plot/plotfile.h"
@@ -35,6 +34,15 @@ EXIT_CODE CheckPlotName(const std::string& path)
 #endif
 }
 
+EXIT_CODE CheckOutputs(const std::string& input, const std::vector<T_OUTPUT>& outputs,
+                       bool overwrite)
+{
+    T_FILE_ERROR error;
+    return CFileCtrl::CheckOutputs(std::span(&input, 1), outputs, overwrite, error)
+               ? EXIT_CODE::Done
+               : ReportFileError(error);
+}
+
 EXIT_CODE WriteOutput(const std::string& path, std::string_view text)
 {
     if (path == "-") {
@@ -60,6 +68,6 @@ EXIT_CODE SaveDocument(CDBDoc& doc, const std::string& path)
 {
     T_FILE_ERROR error;
     const int done =
-        path.ends_with(".qmdb") ? doc.SaveModelAs(path, error) : doc.ExportCase(path, error);
+        CFileCtrl::IsModelName(path) ? doc.SaveModelAs(path, error) : doc.ExportCase(path, error);
     return done ? EXIT_CODE::Done : ReportFileError(error);
 }

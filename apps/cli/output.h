@@ -3,9 +3,11 @@
 
 #include "exitcodes.h"
 #include "qm_db/dbdoc.h"
+#include "qm_db/filectrl.h"
 
 #include <string>
 #include <string_view>
+#include <vector>
 
 struct T_PLOT;
 
@@ -18,6 +20,11 @@ void ShowOnTerminal(const std::string& text, bool last);
 /// Done for no name or one that ends in a picture format that this program can draw; else a
 /// message and Usage.
 EXIT_CODE CheckPlotName(const std::string& path);
+
+/// The rule of all outputs (CFileCtrl::CheckOutputs) for a command that reads this file. Done, or
+/// the code to exit with after one line on stderr.
+EXIT_CODE CheckOutputs(const std::string& input, const std::vector<T_OUTPUT>& outputs,
+                       bool overwrite);
 
 /// Writes to a file, or to standard output for "-".
 EXIT_CODE WriteOutput(const std::string& path, std::string_view text);

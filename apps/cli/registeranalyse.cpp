@@ -24,6 +24,7 @@ void AddAnalyse(CLI::App& app, EXIT_CODE& code)
     sub->add_option("--plot-mode", o->plotMode, Say("IDS_QM_HELP_ANALYSE_PLOT_MODE"))
         ->excludes(plotCase);
     sub->add_option("-o", o->out, Say("IDS_QM_HELP_ANALYSE_OUT"));
+    AddOverwrite(sub, o->overwrite);
     sub->add_flag("--no-store", o->noStore, Say("IDS_QM_HELP_ANALYSE_NO_STORE"));
     sub->footer(
         Say("IDS_QM_HELP_ANALYSE_UNITS") + '\n' +

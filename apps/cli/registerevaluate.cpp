@@ -19,6 +19,7 @@ void AddEvaluate(CLI::App& app, EXIT_CODE& code)
     sub->add_option("--add-step", o->steps, Say("IDS_QM_HELP_EVALUATE_STEP"));
     sub->add_option("--add-spectrum", o->spectra, Say("IDS_QM_HELP_EVALUATE_SPECTRUM"));
     sub->add_flag("--trace", o->trace, Say("IDS_QM_HELP_EVALUATE_TRACE"));
+    AddOverwrite(sub, o->overwrite);
     sub->add_flag("--no-store", o->noStore, Say("IDS_QM_HELP_EVALUATE_NO_STORE"));
     AddExample(sub, "evaluate examples/first-steps/case.json --trace");
     sub->callback([=, &code] { code = RunEvaluate(*o); });
@@ -36,6 +37,7 @@ void AddCompare(CLI::App& app, EXIT_CODE& code)
         ->capture_default_str();
     AddJson(sub, o->json);
     sub->add_option("--plot", o->plot, Say("IDS_QM_HELP_PICTURE"));
+    AddOverwrite(sub, o->overwrite);
     AddExample(sub, "compare examples/first-steps/case.json --push PX --spectrum ATC");
     sub->callback([=, &code] { code = RunCompare(*o); });
 }

@@ -24,6 +24,7 @@ void AddHingeCommands(CLI::App& app, EXIT_CODE& code)
     type(assign, true);
     assign->add_option("--elements", o->elements, Say("IDS_QM_HELP_HINGE_ELEMENTS"))->required();
     assign->add_option("-o", o->out, Say("IDS_QM_HELP_TO_WRITE"))->required();
+    AddOverwrite(assign, o->overwrite);
     AddOne(hinges, "generated", Say("IDS_QM_HELP_HINGE_GENERATED"), "", o, RunHingeGenerated);
     auto* convert =
         AddOne(hinges, "convert", Say("IDS_QM_HELP_HINGE_CONVERT"),
@@ -34,6 +35,7 @@ void AddHingeCommands(CLI::App& app, EXIT_CODE& code)
         ->required()
         ->check(CLI::IsMember({"ddy", "plastic"}));
     convert->add_option("-o", o->out, Say("IDS_QM_HELP_TO_WRITE"))->required();
+    AddOverwrite(convert, o->overwrite);
     auto* axial =
         AddOne(hinges, "axial", Say("IDS_QM_HELP_HINGE_AXIAL"),
                " --type \"steel column\" --component My --add 250 -o axial.json", o, RunHingeAxial);
@@ -45,6 +47,7 @@ void AddHingeCommands(CLI::App& app, EXIT_CODE& code)
     axial->add_option("--remove", o->remove, Say("IDS_QM_HELP_HINGE_REMOVE"));
     axial->add_option("--change", o->change, Say("IDS_QM_HELP_HINGE_CHANGE"))->expected(2);
     axial->add_option("-o", o->out, Say("IDS_QM_HELP_TO_WRITE"))->required();
+    AddOverwrite(axial, o->overwrite);
     auto* plot = AddOne(hinges, "plot", Say("IDS_QM_HELP_HINGE_PLOT"),
                         " --type \"steel beam\" --component My -o hinge.svg", o, RunHingePlot);
     type(plot, true);
@@ -53,6 +56,7 @@ void AddHingeCommands(CLI::App& app, EXIT_CODE& code)
         ->check(CLI::IsMember({"I", "J"}));
     plot->add_flag("--interaction", o->interaction, Say("IDS_QM_HELP_HINGE_INTERACTION"));
     plot->add_option("-o", o->out, Say("IDS_QM_HELP_HINGE_PICTURE"))->required();
+    AddOverwrite(plot, o->overwrite);
 }
 
 void AddCase(CLI::App& app, EXIT_CODE& code)

@@ -11,8 +11,10 @@ void AddImport(CLI::App& app, EXIT_CODE& code)
     auto in = std::make_shared<std::string>(), out = std::make_shared<std::string>();
     sub->add_option("CASE", *in, Say("IDS_QM_HELP_IMPORT_CASE"))->required();
     sub->add_option("MODEL", *out, Say("IDS_QM_HELP_IMPORT_MODEL"))->required();
+    auto overwrite = std::make_shared<bool>(false);
+    AddOverwrite(sub, *overwrite);
     AddExample(sub, "import examples/first-steps/case.json first-steps.qmdb");
-    sub->callback([=, &code] { code = RunImport(*in, *out); });
+    sub->callback([=, &code] { code = RunImport(*in, *out, *overwrite); });
 }
 
 void AddExport(CLI::App& app, EXIT_CODE& code)
@@ -21,8 +23,10 @@ void AddExport(CLI::App& app, EXIT_CODE& code)
     auto in = std::make_shared<std::string>(), out = std::make_shared<std::string>("-");
     sub->add_option("MODEL", *in, Say("IDS_QM_HELP_EXPORT_MODEL"))->required();
     sub->add_option("CASE", *out, Say("IDS_QM_HELP_EXPORT_CASE"))->capture_default_str();
+    auto overwrite = std::make_shared<bool>(false);
+    AddOverwrite(sub, *overwrite);
     AddExample(sub, "export examples/first-steps/case.json -");
-    sub->callback([=, &code] { code = RunExport(*in, *out); });
+    sub->callback([=, &code] { code = RunExport(*in, *out, *overwrite); });
 }
 
 void AddInfo(CLI::App& app, EXIT_CODE& code)

@@ -21,6 +21,12 @@ inline CLI::Option* AddJson(CLI::App* sub, std::string& path,
     return sub->add_option("--json", path, what);
 }
 
+/// Whether files that are there already are replaced.
+inline CLI::Option* AddOverwrite(CLI::App* sub, bool& overwrite)
+{
+    return sub->add_flag("--overwrite", overwrite, Say("IDS_QM_HELP_OVERWRITE"));
+}
+
 /// What stands below the help: `command` without the program's name.
 inline std::string Example(const std::string& command)
 {

@@ -28,6 +28,7 @@ void AddSolve(const T_GROUP& group, const OPTIONS& o)
     solve->add_option("--plot", o->plot, Say("IDS_QM_HELP_ULF_SOLVE_PLOT"));
     AddSum(solve, o->sumStageLoads);
     solve->add_option("--shape-plot", o->shapePlot, Say("IDS_QM_HELP_ULF_SHAPE_PLOT"));
+    AddOverwrite(solve, o->overwrite);
 }
 
 void AddIterate(CLI::App* ulf, EXIT_CODE& code)
@@ -66,12 +67,14 @@ void AddUlf(CLI::App& app, EXIT_CODE& code)
                            " --item \"NO UPLIFT\"", o, RunUlfExplain);
     AddItem(explain, o, true);
     AddJson(explain, o->json, Say("IDS_QM_HELP_ULF_EXPLAIN_JSON"));
+    AddOverwrite(explain, o->overwrite);
     AddSum(explain, o->sumStageLoads);
     auto* sheet = AddOne(group, "export", Say("IDS_QM_HELP_ULF_EXPORT"),
                          " --item LEVEL -o level.xlsx", o, RunUlfExport);
     AddItem(sheet, o, true);
     AddSum(sheet, o->sumStageLoads);
     sheet->add_option("-o", o->out, Say("IDS_QM_HELP_ULF_SHEET"))->required();
+    AddOverwrite(sheet, o->overwrite);
     sheet->add_option("--date", o->date, Say("IDS_QM_HELP_ULF_DATE"));
     sheet->add_option("--sheet-version", o->sheetVersion, Say("IDS_QM_HELP_ULF_SHEET_VERSION"))
         ->capture_default_str();
@@ -80,4 +83,5 @@ void AddUlf(CLI::App& app, EXIT_CODE& code)
     AddItem(combine, o, true);
     combine->add_option("--name", o->name, Say("IDS_QM_HELP_ULF_NAME"))->required();
     combine->add_option("-o", o->out, Say("IDS_QM_HELP_ULF_OUT"));
+    AddOverwrite(combine, o->overwrite);
 }

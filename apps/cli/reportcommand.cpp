@@ -8,8 +8,11 @@
 
 #include <cstdio>
 
-EXIT_CODE RunReportData(const std::string& file, const std::string& out)
+EXIT_CODE RunReportData(const std::string& file, const std::string& out, bool overwrite)
 {
+    if (const EXIT_CODE code = CheckOutputs(file, {{out, OUTPUT_KIND::Json}}, overwrite);
+        code != EXIT_CODE::Done)
+        return code;
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, file); code != EXIT_CODE::Done) return code;
     IRPSInterfaceImpl report;

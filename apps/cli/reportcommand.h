@@ -7,4 +7,4 @@
 
 /// Writes storeys, masses, drifts, curves and results of all load cases as JSON, "-" for standard
 /// output; names the file that it wrote.
-EXIT_CODE RunReportData(const std::string& file, const std::string& out);
+EXIT_CODE RunReportData(const std::string& file, const std::string& out, bool overwrite);

@@ -195,6 +195,13 @@ EXIT_CODE RunUlfSolve(const T_ULF_OPTIONS& o)
     for (const std::string& path : {o.plot, o.shapePlot}) {
         if (const EXIT_CODE code = CheckPlotName(path); code != EXIT_CODE::Done) return code;
     }
+    if (const EXIT_CODE code = CheckOutputs(o.file,
+                                            {{o.json, OUTPUT_KIND::Json},
+                                             {o.plot, OUTPUT_KIND::Picture},
+                                             {o.shapePlot, OUTPUT_KIND::Picture}},
+                                            o.overwrite);
+        code != EXIT_CODE::Done)
+        return code;
     T_ULF_OPENED in;
     if (const EXIT_CODE code = OpenItem(o, in); code != EXIT_CODE::Done) return code;
     if (in.stage && !o.shapePlot.empty())
@@ -215,6 +222,9 @@ EXIT_CODE RunUlfSolve(const T_ULF_OPTIONS& o)
 
 EXIT_CODE RunUlfExplain(const T_ULF_OPTIONS& o)
 {
+    if (const EXIT_CODE code = CheckOutputs(o.file, {{o.json, OUTPUT_KIND::Json}}, o.overwrite);
+        code != EXIT_CODE::Done)
+        return code;
     T_ULF_OPENED in;
     if (const EXIT_CODE code = OpenAndAnalyse(o, in); code != EXIT_CODE::Done) return code;
     const T_ULF_OUTCOME outcome = SolveUlf(*in.dialog);
@@ -235,6 +245,9 @@ EXIT_CODE RunUlfExplain(const T_ULF_OPTIONS& o)
 
 EXIT_CODE RunUlfExport(const T_ULF_OPTIONS& o)
 {
+    if (const EXIT_CODE code = CheckOutputs(o.file, {{o.out, OUTPUT_KIND::Sheet}}, o.overwrite);
+        code != EXIT_CODE::Done)
+        return code;
     T_ULF_SHEET_SETTINGS settings;
     settings.applicationVersion = o.sheetVersion;
     settings.fileName = std::filesystem::path(o.file).filename().string();
@@ -257,6 +270,9 @@ EXIT_CODE RunUlfExport(const T_ULF_OPTIONS& o)
 
 EXIT_CODE RunUlfCombine(const T_ULF_OPTIONS& o)
 {
+    if (const EXIT_CODE code = CheckOutputs(o.file, {{o.out, OUTPUT_KIND::Document}}, o.overwrite);
+        code != EXIT_CODE::Done)
+        return code;
     T_ULF_OPENED in;
     if (const EXIT_CODE code = OpenItem(o, in); code != EXIT_CODE::Done) return code;
     if (in.stage)

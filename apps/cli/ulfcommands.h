@@ -15,6 +15,7 @@ struct T_ULF_OPTIONS {
     std::string name;           // of the combination to make
     std::string date;           // in the spreadsheet, YYYY-MM-DD; empty: today
     int sheetVersion = 16;      // of the spreadsheet program
+    bool overwrite = false;     // files that are there
     bool sumStageLoads = false; // load groups 0 and 1 of a stage item read the sum of all
 };
 

@@ -2,6 +2,7 @@
 
 #include "qm_base/say.h"
 #include "qm_db/casefile.h"
+#include "qm_db/filectrl.h"
 
 #include <algorithm>
 #include <filesystem>
@@ -50,6 +51,7 @@ void CDBDoc::Reset(T_MODEL_CONTENT content, const std::string& path)
     m_data.Assign(std::move(content));
     m_undo.Clear();
     m_path = path;
+    CFileCtrl::MakeFilesLike(path);
 }
 
 void CDBDoc::NewModel()
@@ -87,6 +89,7 @@ int CDBDoc::RecoverModel(const std::string& copy, const std::string& path, T_FIL
 int CDBDoc::ImportCase(const std::string& path, T_FILE_ERROR& error)
 {
     T_MODEL_CONTENT content;
+    CFileCtrl::SweepBeside(path);
     if (!CCaseFile::Read(path, content, error)) return 0;
     m_store.Close();
     Reset(std::move(content), path);
@@ -113,7 +116,8 @@ int CDBDoc::ExportCase(const std::string& path, T_FILE_ERROR& error) const
 
 int CDBDoc::SaveAs(const std::string& path, T_FILE_ERROR& error)
 {
-    if (std::filesystem::path(path).extension() != ".json") return SaveModelAs(path, error);
+    if (!CFileCtrl::CheckOutput({path, OUTPUT_KIND::Document}, error)) return 0;
+    if (CFileCtrl::IsModelName(path)) return SaveModelAs(path, error);
     if (!ExportCase(path, error)) return 0;
     m_path = path;
     m_data.SetModified(false);

@@ -52,8 +52,8 @@ public:
     [[nodiscard]] int SaveModelAs(const std::string& path, T_FILE_ERROR& error);
     [[nodiscard]] int ExportCase(const std::string& path, T_FILE_ERROR& error) const;
 
-    /// Saves as a model file, or as a case file where the path ends with ".json"; the document then
-    /// belongs to that path. 1 done; 0 error filled, the file on disk as it was.
+    /// Saves as a model file (.qmdb) or as a case file (.json); the document then belongs to that
+    /// path. 1 done; 0 error filled, the file on disk as it was.
     [[nodiscard]] int SaveAs(const std::string& path, T_FILE_ERROR& error);
 
     /// Starts an analysis of static load cases, construction stages and eigen modes (see

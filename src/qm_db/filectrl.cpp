@@ -1,12 +1,13 @@
 #include "qm_db/filectrl.h"
 
 #include "qm_base/say.h"
-#include "qm_base/textformat.h"
+#include "qm_db/file/newfile.h"
 #include "qm_db/file/storefault.h"
 
 #include <algorithm>
 #include <cerrno>
 #include <csignal>
+#include <cstdio>
 #include <ctime>
 #include <fcntl.h>
 #include <filesystem>
@@ -73,18 +74,6 @@ int Refuse(const std::string& path, const char* key, int code, T_FILE_ERROR& err
     return 0;
 }
 
-bool WriteAll(int fd, std::string_view text)
-{
-    while (!text.empty()) {
-        const ssize_t count = write(fd, text.data(), text.size());
-        if (count < 0 && errno == EINTR) continue;
-        if (count == 0) errno = ENOSPC;
-        if (count <= 0) return false;
-        text.remove_prefix(static_cast<std::size_t>(count));
-    }
-    return true;
-}
-
 /// The file that a write replaces: a link keeps pointing at it.
 std::string TargetOf(const std::string& path)
 {
@@ -94,30 +83,13 @@ std::string TargetOf(const std::string& path)
     return ignored ? path : target.string();
 }
 
-/// Fills a new file and makes sure that the bytes are on the disk.
-bool WriteNewFile(const std::string& path, mode_t mode, bool setMode, std::string_view text)
-{
-    CScopedDescriptor file(open(path.c_str(), O_WRONLY | O_CREAT | O_EXCL | O_CLOEXEC, mode));
-    return file.Get() >= 0 && (!setMode || fchmod(file.Get(), mode) == 0) &&
-           WriteAll(file.Get(), text) && fsync(file.Get()) == 0 && file.Close();
-}
-
-/// The rename is in place already: a folder that can't be synced is not a failure of the write.
-void SyncFolder(const std::string& path)
-{
-    const std::string folder = std::filesystem::path(path).parent_path().string();
-    const CScopedDescriptor handle(
-        open(folder.empty() ? "." : folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
-    if (handle.Get() >= 0) fsync(handle.Get());
-}
-
 /// Devices and pipes have no old content to keep.
 int WriteSpecial(const std::string& path, std::string_view text, T_FILE_ERROR& error)
 {
-    CScopedDescriptor file(open(path.c_str(), O_WRONLY | O_CLOEXEC));
-    if (file.Get() < 0 || !WriteAll(file.Get(), text) || !file.Close())
-        return Refuse(path, kCantWrite, errno, error);
-    return 1;
+    std::FILE* const file = std::fopen(path.c_str(), "we");
+    if (!file) return Refuse(path, kCantWrite, errno, error);
+    const bool whole = std::fwrite(text.data(), 1, text.size(), file) == text.size();
+    return std::fclose(file) == 0 && whole ? 1 : Refuse(path, kCantWrite, errno, error);
 }
 
 } // namespace
@@ -137,16 +109,23 @@ int CFileCtrl::WriteWholeFile(const std::string& path, std::string_view text, T_
     if (exists && !S_ISREG(old.st_mode)) return WriteSpecial(target, text, error);
     if (exists && access(target.c_str(), W_OK) != 0) return Refuse(path, kCantWrite, errno, error);
 
-    const std::string temporary = target + FormatText(".tmp-%ld", static_cast<long>(getpid()));
-    unlink(temporary.c_str()); // left by a dead process of the same number
-    if (!WriteNewFile(temporary, exists ? old.st_mode & 07777 : 0666, exists, text) ||
-        rename(temporary.c_str(), target.c_str()) != 0) {
-        const int code = errno;
-        unlink(temporary.c_str());
-        return Refuse(path, kCantWrite, code, error);
+    try {
+        CNewFile file(target, kCantWrite);
+        file.Write(text);
+        file.Flush();
+        (void)file.ReplaceTarget();
+        return 1;
+    } catch (const CStoreFault& fault) {
+        error = fault.ForFile(path);
+    } catch (const std::exception& fault) {
+        error = {FILE_FAULT::NoAccess, path + ": " + fault.what()};
     }
-    SyncFolder(target);
-    return 1;
+    return 0;
+}
+
+void CFileCtrl::SweepBeside(const std::string& path)
+{
+    CNewFile::SweepBeside(TargetOf(path));
 }
 
 int CFileCtrl::ReadWholeFile(const std::string& path, std::string& text, T_FILE_ERROR& error)

@@ -6,7 +6,8 @@
 enum class FILE_FAULT {
     None,
     BadInput, // the content is wrong: foreign, damaged, an invalid value
-    NoAccess  // the file can't be opened, read, locked or written
+    NoAccess, // the file can't be opened, read, locked or written
+    Misuse    // a name that can't be meant: an output over an input, or of another kind
 };
 
 struct T_FILE_ERROR {

@@ -1,9 +1,9 @@
 #include "qm_db/modelstore.h"
 
+#include "qm_db/file/newfile.h"
 #include "qm_db/file/storefault.h"
 #include "qm_db/store/modellock.h"
 #include "qm_db/store/modelreader.h"
-#include "qm_db/store/modeltemp.h"
 
 #include <cerrno>
 #include <filesystem>
@@ -58,8 +58,8 @@ int CModelStore::Open(const std::string& path, OPEN_MODE mode, T_MODEL_CONTENT& 
         const bool held = mode == OPEN_MODE::Edit && m_lock && m_lock->Holds(path);
         if (mode == OPEN_MODE::Edit) {
             if (!held) lock = CModelLock::Take(path);
-            CModelTemp::SweepStale(RealPath(path));
         }
+        CNewFile::SweepBeside(RealPath(path));
         out = ReadModelFile(path, CurrentSchema(), CHECK_DEPTH::BySize);
         if (!held) m_lock = std::move(lock);
     });
@@ -76,11 +76,11 @@ int CModelStore::Save(const std::string& path, const T_MODEL_CONTENT& content, T
             if (::access(target.c_str(), W_OK) != 0)
                 ThrowSystem("IDS_QM_DB_FILE_CANT_WRITE", errno);
         }
-        CModelTemp temp(target);
+        CNewFile temp(target, "IDS_QM_DB_FILE_CANT_WRITE");
         WriteModelFile(temp.Path(), content);
         temp.Flush();
         Verify(temp.Path(), content.model);
-        m_lock = temp.ReplaceTarget();
+        m_lock = std::make_unique<CModelLock>(temp.ReplaceTarget());
     });
 }
 

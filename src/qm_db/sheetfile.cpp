@@ -237,6 +237,7 @@ void EdgeRight(T_SHEET& sheet, const T_SHEET_BLOCK& block, SHEET_EDGE edge)
 int WriteSheet(const std::string& path, const T_SHEET& sheet, T_FILE_ERROR& error)
 {
     try {
+        if (!CFileCtrl::CheckOutput({path, OUTPUT_KIND::Sheet}, error)) return 0;
         CheckSheet(sheet);
         CheckNotOpen(path);
         const CNeutralLocale neutral; // the library formats numbers by the locale

@@ -2,6 +2,7 @@
 
 #include "qm_base/messagehistory.h"
 #include "qm_base/msgfunction.h"
+#include "qm_db/filectrl.h"
 
 #include <filesystem>
 
@@ -96,7 +97,7 @@ std::string CMainFrame::Title() const
 
 std::string CMainFrame::SavePath() const
 {
-    return m_readOnly || !m_doc.Path().ends_with(kExtension) ? std::string() : m_doc.Path();
+    return m_readOnly || !CFileCtrl::IsModelName(m_doc.Path()) ? std::string() : m_doc.Path();
 }
 
 /// Edits are saved or given up; false: the person wants to go on with the document.
@@ -167,7 +168,12 @@ int CMainFrame::OnSave()
 int CMainFrame::OnSaveAs(const std::string& path)
 {
     std::string to = path;
-    if (std::filesystem::path(to).extension().empty()) to += kExtension;
+    if (std::filesystem::path(to).extension().empty()) {
+        to += kExtension; // a name that the person was not asked about
+        constexpr const char* kKey = "IDS_QM_UI_REPLACE";
+        if (std::filesystem::exists(to) && !AskYesNo(kKey, MMSGFunction::Format(kKey, {to})))
+            return 0;
+    }
     T_FILE_ERROR error;
     if (!m_doc.SaveAs(to, error)) return Refuse(error.text);
     m_readOnly = false;
@@ -181,7 +187,8 @@ int CMainFrame::OnSaveAs(const std::string& path)
 int CMainFrame::OnExportCase(const std::string& path)
 {
     T_FILE_ERROR error;
-    if (!m_doc.ExportCase(path, error)) return Refuse(error.text);
+    if (!CFileCtrl::CheckOutput({path, OUTPUT_KIND::Json}, error) || !m_doc.ExportCase(path, error))
+        return Refuse(error.text);
     Note("IDS_QM_UI_SAVED", path);
     return 1;
 }

@@ -1,6 +1,5 @@
 #include "qm_rps/factors/ulfiteration.h"
 
-#include "qm_base/logfile.h"
 #include "qm_base/msgfunction.h"
 #include "qm_db/filectrl.h"
 
@@ -43,9 +42,17 @@ int CUlfIteration::WriteFirst()
     std::error_code ignored;
     const bool add = std::filesystem::exists(m_report, ignored) && !m_person.MayOverwrite(m_report);
     T_FILE_ERROR error;
-    const int written =
-        add ? CLogFile(m_report).Write(text) : CFileCtrl::WriteWholeFile(m_report, text, error);
-    return written ? 1 : RefuseReport();
+    m_reportText.clear();
+    if (add && !CFileCtrl::ReadWholeFile(m_report, m_reportText, error)) return RefuseReport();
+    return AddToReport(text);
+}
+
+/// The report is written as a whole: a full disk leaves the blocks before.
+int CUlfIteration::AddToReport(const std::string& text)
+{
+    m_reportText += text;
+    T_FILE_ERROR error;
+    return CFileCtrl::WriteWholeFile(m_report, m_reportText, error) ? 1 : RefuseReport();
 }
 
 int CUlfIteration::AskForMore()
@@ -91,7 +98,7 @@ int CUlfIteration::Iterate(int iteration)
 {
     if (!m_host.SaveCopy(UlfIterCopyPath(m_model, iteration))) return Stop(ULF_ITER_END::NotSaved);
     if (!Scale() || !Analyse(iteration) || !Solve(iteration)) return 0;
-    if (!CLogFile(m_report).Write(UlfIterBlock(m_history.back()))) return RefuseReport();
+    if (!AddToReport(UlfIterBlock(m_history.back()))) return 0;
     if (m_settings.tolerance >= m_history.back().tolerance) return Stop(ULF_ITER_END::Converged);
     return AskForMore();
 }

@@ -47,6 +47,7 @@ private:
     int Stop(ULF_ITER_END end);
     [[nodiscard]] int Solve(int iteration);
     [[nodiscard]] int WriteFirst();
+    [[nodiscard]] int AddToReport(const std::string& text);
     int RefuseReport();
     [[nodiscard]] int AskForMore();
     [[nodiscard]] int Scale();
@@ -62,5 +63,6 @@ private:
     bool m_asks = true;  // the person is asked before each iteration
     std::string m_model; // path at the start: copies are numbered from it
     std::string m_report;
+    std::string m_reportText; // as in the file
     ULF_ITER_END m_end = ULF_ITER_END::Declined;
 };

@@ -261,7 +261,9 @@ std::string PushoverReportText(const T_PUSH_EVALUATION& e)
 int WritePushoverText(const std::string& text, const std::string& path, std::string& error)
 {
     T_FILE_ERROR fault;
-    if (CFileCtrl::WriteWholeFile(path, text, fault)) return 1;
+    if (CFileCtrl::CheckOutput({path, OUTPUT_KIND::Text}, fault) &&
+        CFileCtrl::WriteWholeFile(path, text, fault))
+        return 1;
     error =
         MMSGFunction::Format("IDS_RPS_PUSHOVER_Can_t_create_the_file__", {path}) + " " + fault.text;
     return 0;

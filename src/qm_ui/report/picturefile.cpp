@@ -1,5 +1,7 @@
 #include "qm_ui/report/picturefile.h"
 
+#include "qm_db/filectrl.h"
+
 #include <QBuffer>
 #include <QByteArray>
 #include <QGuiApplication>
@@ -8,7 +10,6 @@
 #include <QPageSize>
 #include <QPainter>
 #include <QPdfWriter>
-#include <QSaveFile>
 #include <QString>
 #include <QSvgGenerator>
 
@@ -18,6 +19,7 @@
 #include <cstdio>
 #include <exception>
 #include <memory>
+#include <string_view>
 
 namespace {
 
@@ -150,11 +152,11 @@ private:
 
 int WriteAll(const QString& path, const QByteArray& bytes, std::string& error)
 {
-    QSaveFile file(path); // a temporary file beside, renamed by commit
-    const bool done =
-        file.open(QIODevice::WriteOnly) && file.write(bytes) == bytes.size() && file.commit();
-    if (!done) error = path.toStdString() + ": can't write: " + file.errorString().toStdString();
-    return done ? 1 : 0;
+    T_FILE_ERROR fault;
+    const std::string_view text(bytes.constData(), static_cast<std::size_t>(bytes.size()));
+    const int done = CFileCtrl::WriteWholeFile(path.toStdString(), text, fault);
+    error = fault.text;
+    return done;
 }
 
 int WriteChecked(const T_DRAWING& drawing, const QString& path, std::string& error)

@@ -24,10 +24,10 @@ while [ "$run" -lt "$kills" ]; do
         exit 1
     fi
     wait "$saver" 2>/dev/null || true
-    if [ "$(find "$folder" -name '*.tmp-*' | wc -l)" -gt 0 ]; then hit=$((hit + 1)); fi
+    if [ "$(find "$folder" -name '*.qm.tmp-*' | wc -l)" -gt 0 ]; then hit=$((hit + 1)); fi
     if [ -e "$model" ]; then
         "$helper" check "$model" "$log" || { echo "killsave: run $run" >&2; exit 1; }
-        if [ "$(find "$folder" -name '*.tmp-*' | wc -l)" -gt 0 ]; then
+        if [ "$(find "$folder" -name '*.qm.tmp-*' | wc -l)" -gt 0 ]; then
             echo "killsave: a temporary file is left in run $run" >&2
             exit 1
         fi

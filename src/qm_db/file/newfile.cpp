@@ -1,4 +1,4 @@
-#include "qm_db/store/modeltemp.h"
+#include "qm_db/file/newfile.h"
 
 #include "qm_db/file/storefault.h"
 
@@ -16,20 +16,20 @@ namespace fs = std::filesystem;
 
 namespace {
 
-constexpr const char* kMark = ".tmp-";
-constexpr const char* kCantWrite = "IDS_QM_DB_FILE_CANT_WRITE";
-constexpr std::time_t kOldS = 600; // longer than any save takes, s
+constexpr std::string_view kMark = ".qm.tmp-"; // of this program alone: a sweep goes by it
+constexpr std::time_t kOldS = 600;             // longer than any write takes, s
 
 std::string TempPath(const std::string& target)
 {
     static std::atomic<unsigned> counter{0};
-    return target + kMark + std::to_string(::getpid()) + '-' + std::to_string(++counter);
+    return target + std::string(kMark) + std::to_string(::getpid()) + '-' +
+           std::to_string(++counter);
 }
 
-int CreateNew(const std::string& path, mode_t mode)
+int CreateNew(const std::string& path, mode_t mode, const char* key)
 {
     const int descriptor = ::open(path.c_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, mode);
-    if (descriptor < 0) ThrowSystem(kCantWrite, errno);
+    if (descriptor < 0) ThrowSystem(key, errno);
     return descriptor;
 }
 
@@ -45,14 +45,14 @@ std::string FolderOf(const std::string& path)
     return folder.empty() ? "." : folder;
 }
 
-/// "frame.qmdb.tmp-123-4" of the target "frame.qmdb" gives 123; anything else gives 0.
-pid_t ProcessOf(const std::string& name, const std::string& targetName)
+/// "frame.qmdb.qm.tmp-123-4" gives 123; a name of another pattern gives 0.
+pid_t ProcessOf(const std::string& name)
 {
-    const std::string prefix = targetName + kMark;
-    if (!name.starts_with(prefix)) return 0;
+    const auto mark = name.rfind(kMark);
+    if (mark == name.npos || mark == 0) return 0;
     const char* const end = name.data() + name.size();
     pid_t process = 0;
-    const auto first = std::from_chars(name.data() + prefix.size(), end, process);
+    const auto first = std::from_chars(name.data() + mark + kMark.size(), end, process);
     if (first.ec != std::errc{} || first.ptr == end || *first.ptr != '-') return 0;
     unsigned counter = 0;
     const auto second = std::from_chars(first.ptr + 1, end, counter);
@@ -70,22 +70,38 @@ bool IsStale(const std::string& path, pid_t process)
 } // namespace
 
 // Ours alone until it takes the old file's permissions; without an old file those of any new file.
-CModelTemp::CModelTemp(const std::string& target)
-    : m_target(target), m_path(TempPath(target)), m_targetExists(Exists(target)),
-      m_file(CreateNew(m_path, m_targetExists ? 0600 : 0666))
+CNewFile::CNewFile(const std::string& target, const char* key)
+    : m_target(target), m_key(key), m_path(TempPath(target)), m_targetExists(Exists(target)),
+      m_file(CreateNew(m_path, m_targetExists ? 0600 : 0666, key))
 {
+    SweepBeside(target);
     if (m_file.TryLock()) return;
     const int reason = errno;
     ::unlink(m_path.c_str());
-    ThrowSystem(kCantWrite, reason);
+    Fail(reason);
 }
 
-CModelTemp::~CModelTemp()
+CNewFile::~CNewFile()
 {
     if (!m_isRemoved) ::unlink(m_path.c_str());
 }
 
-void CModelTemp::TakeOldPermissions() const
+void CNewFile::Fail(int errorNumber) const
+{
+    ThrowSystem(m_key, errorNumber);
+}
+
+void CNewFile::Write(std::string_view bytes) const
+{
+    while (!bytes.empty()) {
+        const ssize_t count = ::write(m_file.Get(), bytes.data(), bytes.size());
+        if (count < 0 && errno == EINTR) continue;
+        if (count <= 0) Fail(count == 0 ? ENOSPC : errno);
+        bytes.remove_prefix(static_cast<std::size_t>(count));
+    }
+}
+
+void CNewFile::TakeOldPermissions() const
 {
     struct stat old = {};
     if (::stat(m_target.c_str(), &old) != 0) return;
@@ -94,19 +110,19 @@ void CModelTemp::TakeOldPermissions() const
     const bool sameOwner = (old.st_uid == mine.st_uid && old.st_gid == mine.st_gid) ||
                            ::fchown(m_file.Get(), old.st_uid, old.st_gid) == 0;
     const mode_t keep = sameOwner ? 07777 : 0777;
-    if (::fchmod(m_file.Get(), old.st_mode & keep) != 0) ThrowSystem(kCantWrite, errno);
+    if (::fchmod(m_file.Get(), old.st_mode & keep) != 0) Fail(errno);
 }
 
-void CModelTemp::Flush() const
+void CNewFile::Flush() const
 {
-    if (::fsync(m_file.Get()) != 0) ThrowSystem(kCantWrite, errno);
+    if (::fsync(m_file.Get()) != 0) Fail(errno);
 }
 
-std::unique_ptr<CModelLock> CModelTemp::ReplaceTarget()
+CFileHandle CNewFile::ReplaceTarget()
 {
     const CFileHandle folder(
         ::open(FolderOf(m_target).c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
-    if (!folder.IsOpen()) ThrowSystem(kCantWrite, errno);
+    if (!folder.IsOpen()) Fail(errno);
 
     if (m_targetExists) {
         TakeOldPermissions();
@@ -118,21 +134,20 @@ std::unique_ptr<CModelLock> CModelTemp::ReplaceTarget()
     errno = EINVAL;
     if (!m_targetExists) failed = ::renameat2(AT_FDCWD, from, AT_FDCWD, to, RENAME_NOREPLACE);
     if (failed && errno == EINVAL) failed = std::rename(from, to); // also: not all folders can that
-    if (failed) ThrowSystem(kCantWrite, errno);
+    if (failed) Fail(errno);
     m_isRemoved = true;
 
     // The new file is whole and in its place; a folder that can't be flushed changes nothing.
     (void)!::fsync(folder.Get());
-    return std::make_unique<CModelLock>(std::move(m_file));
+    return std::move(m_file);
 }
 
-void CModelTemp::SweepStale(const std::string& target)
+void CNewFile::SweepBeside(const std::string& path)
 {
-    const std::string name = fs::path(target).filename().string();
     std::error_code ignored; // what can't be read or removed stays
-    for (fs::directory_iterator it(FolderOf(target), ignored), end; it != end;
+    for (fs::directory_iterator it(FolderOf(path), ignored), end; !ignored && it != end;
          it.increment(ignored)) {
-        const pid_t process = ProcessOf(it->path().filename().string(), name);
+        const pid_t process = ProcessOf(it->path().filename().string());
         if (process > 0 && IsStale(it->path().string(), process)) ::unlink(it->path().c_str());
     }
 }
