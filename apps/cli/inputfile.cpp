@@ -1,5 +1,7 @@
 #include "inputfile.h"
 
+#include "qm_base/visibletext.h"
+
 #include <cstdio>
 
 bool IsModelFile(const std::string& path)
@@ -9,9 +11,10 @@ bool IsModelFile(const std::string& path)
 
 EXIT_CODE ReportFileError(const T_FILE_ERROR& error)
 {
-    std::fprintf(stderr, "qm-rps: %s\n", error.text.c_str());
+    std::fprintf(stderr, "qm-rps: %s\n", VisibleLine(error.text).c_str());
     switch (error.fault) {
     case FILE_FAULT::NoAccess:
+    case FILE_FAULT::Changed:
         return EXIT_CODE::NoAccess;
     case FILE_FAULT::Misuse:
         return EXIT_CODE::Usage;

@@ -51,6 +51,7 @@ void CDBDoc::Reset(T_MODEL_CONTENT content, const std::string& path)
     m_data.Assign(std::move(content));
     m_undo.Clear();
     m_path = path;
+    m_caseSum.reset();
     CFileCtrl::MakeFilesLike(path);
 }
 
@@ -90,9 +91,14 @@ int CDBDoc::ImportCase(const std::string& path, T_FILE_ERROR& error)
 {
     T_MODEL_CONTENT content;
     CFileCtrl::SweepBeside(path);
-    if (!CCaseFile::Read(path, content, error)) return 0;
+    std::string text;
+    const std::string folder = std::filesystem::path(path).parent_path().string();
+    if (!CFileCtrl::ReadWholeFile(path, text, error) ||
+        !CCaseFile::Parse(text, path, folder, content, error))
+        return 0;
     m_store.Close();
     Reset(std::move(content), path);
+    m_caseSum = CFileCtrl::SumOf(text);
     return 1;
 }
 
@@ -103,8 +109,10 @@ int CDBDoc::SaveModel(T_FILE_ERROR& error)
 
 int CDBDoc::SaveModelAs(const std::string& path, T_FILE_ERROR& error)
 {
+    std::string saved = path;
     if (!m_store.Save(path, m_data.Content(), error)) return 0;
-    m_path = path;
+    m_caseSum.reset();
+    m_path = std::move(saved);
     m_data.SetModified(false);
     return 1;
 }
@@ -118,10 +126,25 @@ int CDBDoc::SaveAs(const std::string& path, T_FILE_ERROR& error)
 {
     if (!CFileCtrl::CheckOutput({path, OUTPUT_KIND::Document}, error)) return 0;
     if (CFileCtrl::IsModelName(path)) return SaveModelAs(path, error);
-    if (!ExportCase(path, error)) return 0;
+    std::string text;
+    if (!CCaseFile::Print(m_data.Content(), text, error)) {
+        error.text = path + ": " + error.text;
+        return 0;
+    }
+    const bool isKnown = m_caseSum && path == m_path;
+    if (!(isKnown ? CFileCtrl::UpdateWholeFile(path, text, *m_caseSum, error)
+                  : CFileCtrl::WriteWholeFile(path, text, error)))
+        return 0;
     m_path = path;
+    m_caseSum = CFileCtrl::SumOf(text);
     m_data.SetModified(false);
     return 1;
+}
+
+void CDBDoc::AcceptChanges()
+{
+    m_store.AcceptChanges();
+    m_caseSum.reset();
 }
 
 int CDBDoc::StartAnalysis(T_ANALYSIS_OPTIONS options, T_ANALYSIS_ERROR& error)

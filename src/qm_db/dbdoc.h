@@ -11,6 +11,9 @@
 #include "qm_db/postctrl.h"
 #include "qm_db/unitctrl.h"
 
+#include <cstdint>
+#include <optional>
+
 class CDBDoc {
 public:
     CDBDoc();
@@ -47,7 +50,7 @@ public:
                                    T_FILE_ERROR& error);
     [[nodiscard]] int ImportCase(const std::string& path, T_FILE_ERROR& error);
     /// Saves to the file it was opened from, or to another one. 1 done; 0 error filled, the file
-    /// on disk as it was.
+    /// on disk as it was: also when another program has changed it meanwhile (fault Changed).
     [[nodiscard]] int SaveModel(T_FILE_ERROR& error);
     [[nodiscard]] int SaveModelAs(const std::string& path, T_FILE_ERROR& error);
     [[nodiscard]] int ExportCase(const std::string& path, T_FILE_ERROR& error) const;
@@ -55,6 +58,8 @@ public:
     /// Saves as a model file (.qmdb) or as a case file (.json); the document then belongs to that
     /// path. 1 done; 0 error filled, the file on disk as it was.
     [[nodiscard]] int SaveAs(const std::string& path, T_FILE_ERROR& error);
+    /// The next save replaces what is there, whoever has changed it.
+    void AcceptChanges();
 
     /// Starts an analysis of static load cases, construction stages and eigen modes (see
     /// CAnalysisRun::Compute) of a copy of the model in a thread of its own. Until PollAnalysis
@@ -99,6 +104,7 @@ private:
     CDynModuleMgr m_modules;
     CModelStore m_store;
     std::string m_path;
+    std::optional<std::uint64_t> m_caseSum; // of the case file that was read or saved last
 
     /// The run that is under way, and how the latest one has ended.
     std::shared_ptr<CAnalysisWorker> m_worker;

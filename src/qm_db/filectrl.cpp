@@ -1,8 +1,10 @@
 #include "qm_db/filectrl.h"
 
 #include "qm_base/say.h"
+#include "qm_db/file/checksum.h"
 #include "qm_db/file/newfile.h"
 #include "qm_db/file/storefault.h"
+#include "qm_db/store/modellock.h"
 
 #include <algorithm>
 #include <cerrno>
@@ -11,6 +13,7 @@
 #include <ctime>
 #include <fcntl.h>
 #include <filesystem>
+#include <memory>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -121,6 +124,34 @@ int CFileCtrl::WriteWholeFile(const std::string& path, std::string_view text, T_
         error = {FILE_FAULT::NoAccess, path + ": " + fault.what()};
     }
     return 0;
+}
+
+int CFileCtrl::UpdateWholeFile(const std::string& path, std::string_view text,
+                               std::uint64_t sumBefore, T_FILE_ERROR& error)
+{
+    try {
+        std::unique_ptr<CModelLock> lock;
+        std::string now;
+        if (std::filesystem::exists(path)) {
+            lock = CModelLock::Take(path);
+            if (!ReadWholeFile(path, now, error)) return 0;
+            if (SumOf(now) != sumBefore)
+                throw CStoreFault(FILE_FAULT::Changed, "IDS_QM_DB_FILE_CHANGED");
+        }
+        return WriteWholeFile(path, text, error);
+    } catch (const CStoreFault& fault) {
+        error = fault.ForFile(path);
+    } catch (const std::exception& fault) {
+        error = {FILE_FAULT::NoAccess, path + ": " + fault.what()};
+    }
+    return 0;
+}
+
+std::uint64_t CFileCtrl::SumOf(std::string_view text)
+{
+    CChecksum sum;
+    sum.AddBytes(std::as_bytes(std::span(text)));
+    return sum.Value();
 }
 
 void CFileCtrl::SweepBeside(const std::string& path)

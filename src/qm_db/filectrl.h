@@ -3,6 +3,7 @@
 
 #include "qm_db/fileerror.h"
 
+#include <cstdint>
 #include <span>
 #include <string>
 #include <string_view>
@@ -31,6 +32,12 @@ public:
     /// leaves the old file. 1 done; 0 error filled (fault NoAccess, names the file and the reason).
     [[nodiscard]] static int WriteWholeFile(const std::string& path, std::string_view text,
                                             T_FILE_ERROR& error);
+    /// The same over a file that was read before: refused (fault Changed) where its content has
+    /// another sum by now, and while another writer has it.
+    [[nodiscard]] static int UpdateWholeFile(const std::string& path, std::string_view text,
+                                             std::uint64_t sumBefore, T_FILE_ERROR& error);
+    /// Of the bytes of a file.
+    static std::uint64_t SumOf(std::string_view text);
     /// The rule of all outputs of one run, to be asked before anything is written. Refused: a name
     /// whose ending does not go with the kind, an output over one of the inputs, two outputs to one
     /// file, a model file that something else would replace (Misuse); and, unless `overwrite`, a

@@ -8,6 +8,7 @@
 #include <cerrno>
 #include <filesystem>
 #include <fstream>
+#include <optional>
 #include <unistd.h>
 
 namespace fs = std::filesystem;
@@ -38,6 +39,16 @@ std::string RealPath(const std::string& path)
     return none ? path : real.string();
 }
 
+/// Nothing for what is no model file (any more).
+std::optional<std::uint64_t> StampAt(const std::string& path)
+{
+    try {
+        return StampOfModelFile(path);
+    } catch (const CStoreFault&) {
+        return std::nullopt;
+    }
+}
+
 /// The model and all sums were right after reading back; is it the model that was meant?
 void Verify(const std::string& path, const T_MODEL& model)
 {
@@ -60,8 +71,12 @@ int CModelStore::Open(const std::string& path, OPEN_MODE mode, T_MODEL_CONTENT& 
             if (!held) lock = CModelLock::Take(path);
         }
         CNewFile::SweepBeside(RealPath(path));
+        // Before reading: a change between the two shows at the next save.
+        const std::optional<std::uint64_t> stamp = StampAt(path);
         out = ReadModelFile(path, CurrentSchema(), CHECK_DEPTH::BySize);
         if (!held) m_lock = std::move(lock);
+        m_known = RealPath(path);
+        m_stamp = stamp.value_or(0);
     });
 }
 
@@ -75,12 +90,20 @@ int CModelStore::Save(const std::string& path, const T_MODEL_CONTENT& content, T
             if (!m_lock || !m_lock->Holds(target)) lock = CModelLock::Take(target);
             if (::access(target.c_str(), W_OK) != 0)
                 ThrowSystem("IDS_QM_DB_FILE_CANT_WRITE", errno);
+            if (m_known == target && StampAt(target) != m_stamp)
+                throw CStoreFault(FILE_FAULT::Changed, "IDS_QM_DB_FILE_CHANGED");
         }
         CNewFile temp(target, "IDS_QM_DB_FILE_CANT_WRITE");
         WriteModelFile(temp.Path(), content);
         temp.Flush();
         Verify(temp.Path(), content.model);
-        m_lock = std::make_unique<CModelLock>(temp.ReplaceTarget());
+        const std::uint64_t stamp = StampOfModelFile(temp.Path());
+        auto next = std::make_unique<CModelLock>(CFileHandle(-1));
+        std::string known = target;
+        *next = CModelLock(temp.ReplaceTarget()); // nothing behind this can fail
+        m_lock = std::move(next);
+        m_known = std::move(known);
+        m_stamp = stamp;
     });
 }
 
@@ -103,4 +126,5 @@ bool CModelStore::IsModelFile(const std::string& path)
 void CModelStore::Close()
 {
     m_lock.reset();
+    m_known.clear();
 }

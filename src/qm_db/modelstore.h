@@ -8,6 +8,7 @@
 #include "qm_db/results/pushresult.h"
 #include "qm_db/results/stagedresult.h"
 
+#include <cstdint>
 #include <memory>
 #include <string>
 
@@ -43,8 +44,9 @@ public:
                            T_FILE_ERROR& error);
 
     /// Writes the model with all its results (lazy ones are copied block by block). Refused when
-    /// another process or document has the file open for editing. 1 done; 0 error filled and the
-    /// file on disk is as it was.
+    /// another process or document has the file open for editing, or has changed it since this
+    /// object opened or saved it (fault Changed). 1 done; 0 error filled and the file on disk is as
+    /// it was.
     [[nodiscard]] int Save(const std::string& path, const T_MODEL_CONTENT& content,
                            T_FILE_ERROR& error);
 
@@ -56,7 +58,11 @@ public:
 
     /// Gives up the writer's lock, if held.
     void Close();
+    /// The next save replaces what is there, whoever has changed it.
+    void AcceptChanges() { m_known.clear(); }
 
 private:
     std::unique_ptr<CModelLock> m_lock; // held after Open(Edit) or Save
+    std::string m_known;                // file that was opened or saved last; empty: none
+    std::uint64_t m_stamp = 0;          // of it, as it was then
 };

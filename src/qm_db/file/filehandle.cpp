@@ -13,6 +13,12 @@ CFileHandle::CFileHandle(CFileHandle&& other) noexcept
 {
 }
 
+CFileHandle& CFileHandle::operator=(CFileHandle&& other) noexcept
+{
+    std::swap(m_descriptor, other.m_descriptor);
+    return *this;
+}
+
 CFileHandle::~CFileHandle()
 {
     if (m_descriptor >= 0) ::close(m_descriptor);

@@ -8,7 +8,7 @@ class CFileHandle {
 public:
     explicit CFileHandle(int descriptor) : m_descriptor(descriptor) {}
     CFileHandle(CFileHandle&& other) noexcept;
-    CFileHandle& operator=(CFileHandle&&) = delete;
+    CFileHandle& operator=(CFileHandle&& other) noexcept;
     ~CFileHandle();
 
     /// A regular file for reading; else CStoreFault (NoAccess) with that message key.

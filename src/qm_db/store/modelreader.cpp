@@ -194,6 +194,13 @@ T_MODEL_CONTENT ReadModelFile(const std::string& path, const T_SCHEMA& schema, C
     return content;
 }
 
+std::uint64_t StampOfModelFile(const std::string& path)
+{
+    (void)CheckHeader(path, CurrentSchema());
+    return SumOfRows(CSqliteDb::OpenReadOnly(path),
+                     std::string("SELECT name, value FROM ") + kSumTable + " ORDER BY name");
+}
+
 void WriteChecksums(const CSqliteDb& db)
 {
     CSqliteStmt insert(db, std::string("INSERT OR REPLACE INTO ") + kSumTable +

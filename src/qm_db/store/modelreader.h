@@ -13,6 +13,10 @@ enum class CHECK_DEPTH {
 /// and blocks. An older file is brought up to the schema's version in memory.
 T_MODEL_CONTENT ReadModelFile(const std::string& path, const T_SCHEMA& schema, CHECK_DEPTH depth);
 
+/// What tells one state of a model file from another: a sum over its own table of checksums, which
+/// has one for every table and every result block. Throws for what is no model file.
+std::uint64_t StampOfModelFile(const std::string& path);
+
 /// Makes the tables in an empty file and writes model, results and checksums.
 void WriteModelFile(const std::string& path, const T_MODEL_CONTENT& content);
 
