@@ -1,5 +1,6 @@
 #include "qm_db/autosave.h"
 
+#include "qm_base/textformat.h"
 #include "qm_db/dbdoc.h"
 #include "qm_db/file/storefault.h"
 #include "qm_db/store/modellock.h"
@@ -8,6 +9,10 @@
 #include <charconv>
 #include <chrono>
 #include <filesystem>
+#include <functional>
+#include <optional>
+#include <random>
+#include <set>
 
 namespace fs = std::filesystem;
 
@@ -16,9 +21,28 @@ namespace {
 constexpr std::string_view kMark = ".auto-";
 constexpr double kTimesWriting = 20.0; // of the time that a copy takes, between copies
 
-std::string CopyPath(const std::string& file, long sequence)
+std::string CopyPath(const std::string& file, const std::string& session, long sequence)
 {
-    return file + std::string(kMark) + std::to_string(sequence);
+    return file + std::string(kMark) + session + '-' + std::to_string(sequence);
+}
+
+/// Two sessions never have the same name, on whatever machines they run.
+std::string NewSession()
+{
+    std::random_device source;
+    return FormatText("%08x%08x", source(), source());
+}
+
+/// "<session>-<sequence number>"; nothing for another text.
+std::optional<T_AUTOSAVE_COPY> ParseCopy(std::string_view text)
+{
+    const auto dash = text.find('-');
+    if (dash == text.npos || dash == 0) return std::nullopt;
+    long sequence = 0;
+    const char* const last = text.data() + text.size();
+    const auto [stop, fault] = std::from_chars(text.data() + dash + 1, last, sequence);
+    if (fault != std::errc() || stop != last || sequence <= 0) return std::nullopt;
+    return T_AUTOSAVE_COPY{{}, std::string(text.substr(0, dash)), sequence};
 }
 
 /// Every copy of a file, the newest first.
@@ -32,11 +56,11 @@ std::vector<T_AUTOSAVE_COPY> AllCopies(const std::string& file)
     for (fs::directory_iterator it(folder, none), end; !none && it != end; it.increment(none)) {
         const std::string name = it->path().filename().string();
         if (!name.starts_with(begin)) continue;
-        long sequence = 0;
-        const char* const last = name.data() + name.size();
-        const auto [stop, fault] = std::from_chars(name.data() + begin.size(), last, sequence);
-        if (fault == std::errc() && stop == last && sequence > 0)
-            copies.push_back({CopyPath(file, sequence), sequence});
+        std::optional<T_AUTOSAVE_COPY> copy =
+            ParseCopy(std::string_view(name).substr(begin.size()));
+        if (!copy) continue;
+        copy->path = CopyPath(file, copy->session, copy->sequence);
+        copies.push_back(std::move(*copy));
     }
     std::ranges::sort(copies, std::greater<>(), &T_AUTOSAVE_COPY::sequence);
     return copies;
@@ -59,11 +83,14 @@ void RemoveFile(const std::string& path)
 
 } // namespace
 
+CAutosave::CAutosave(CDBDoc& doc) : m_doc(doc), m_session(NewSession()) {}
 CAutosave::~CAutosave() = default;
 
 void CAutosave::Follow(const std::string& file)
 {
     m_copies.clear();
+    m_taken.clear();
+    m_session = NewSession(); // what stays beside the file before is no longer ours
     m_file = file;
     m_revision = -1;
     m_started = false;
@@ -92,29 +119,39 @@ AUTOSAVE CAutosave::Tick(double nowS, T_FILE_ERROR& error)
 int CAutosave::Write(T_FILE_ERROR& error)
 {
     auto store = std::make_unique<CModelStore>();
-    if (!store->Save(CopyPath(m_file, m_next), m_doc.Data().Content(), error)) return 0;
+    const std::string path = CopyPath(m_file, m_session, m_next);
+    if (!store->Save(path, m_doc.Data().Content(), error)) return 0;
     m_copies[m_next++] = std::move(store);
-    const auto copies = AllCopies(m_file);
-    for (std::size_t i = kKept; i < copies.size(); ++i) {
-        m_copies.erase(copies[i].sequence);
-        RemoveFile(copies[i].path);
+    std::size_t kept = 0;
+    for (const T_AUTOSAVE_COPY& copy : AllCopies(m_file)) {
+        const bool isTaken = m_taken.contains(copy.path);
+        if ((copy.session != m_session && !isTaken) || ++kept <= kKept) continue;
+        RemoveFile(copy.path);
+        m_taken.erase(copy.path);
+        m_copies.erase(copy.sequence);
     }
     return 1;
 }
 
+/// Files first: until they are gone nobody else may take them for those of a crash.
 void CAutosave::Remove()
 {
+    for (const auto& entry : m_copies)
+        RemoveFile(CopyPath(m_file, m_session, entry.first));
+    for (const auto& entry : m_taken)
+        RemoveFile(entry.first);
     m_copies.clear();
-    for (const T_AUTOSAVE_COPY& copy : AllCopies(m_file))
-        RemoveFile(copy.path);
+    m_taken.clear();
     m_revision = -1;
 }
 
 std::vector<T_AUTOSAVE_COPY> CAutosave::Find(const std::string& file)
 {
     std::vector<T_AUTOSAVE_COPY> copies = AllCopies(file);
-    if (std::ranges::any_of(copies, [](const auto& copy) { return IsInUse(copy.path); }))
-        copies.clear();
+    std::set<std::string> running;
+    for (const T_AUTOSAVE_COPY& copy : copies)
+        if (IsInUse(copy.path)) running.insert(copy.session);
+    std::erase_if(copies, [&](const auto& copy) { return running.contains(copy.session); });
     return copies;
 }
 
@@ -127,4 +164,17 @@ int CAutosave::Newest(const std::string& file, T_AUTOSAVE_COPY& out)
         return 1;
     }
     return 0;
+}
+
+int CAutosave::TakeOver(const T_AUTOSAVE_COPY& copy)
+{
+    std::map<std::string, std::unique_ptr<CModelLock>> taken;
+    try {
+        for (const T_AUTOSAVE_COPY& other : AllCopies(m_file))
+            if (other.session == copy.session) taken[other.path] = CModelLock::Take(other.path);
+    } catch (const CStoreFault&) {
+        return 0;
+    }
+    m_taken.merge(taken);
+    return 1;
 }

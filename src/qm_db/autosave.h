@@ -1,8 +1,10 @@
 // Copies of a document beside its file, for the case that the program ends without saving it.
 //
-// A copy is a whole model file, "<file>.auto-<sequence number>", written as every model file is: a
-// temporary file, read back and compared, renamed. The newest three are kept; an older one goes
-// only when a newer one has been verified. File dates are never asked for.
+// A copy is a whole model file, "<file>.auto-<session>-<sequence number>", written as every model
+// file is: a temporary file, read back and compared, renamed. It belongs to one session, which
+// holds its lock: so nobody else takes it for one that a crash has left, or removes it. The newest
+// three of a session are kept; an older one goes only when a newer one has been verified. File
+// dates are never asked for.
 #pragma once
 
 #include "qm_db/modelstore.h"
@@ -15,6 +17,7 @@ class CDBDoc;
 
 struct T_AUTOSAVE_COPY {
     std::string path;
+    std::string session;
     long sequence = 0;
     bool operator==(const T_AUTOSAVE_COPY&) const = default;
 };
@@ -27,14 +30,15 @@ public:
     static constexpr std::size_t kKept = 3;
 
     /// The document must outlive the object.
-    explicit CAutosave(CDBDoc& doc) : m_doc(doc) {}
+    explicit CAutosave(CDBDoc& doc);
     ~CAutosave();
     CAutosave(const CAutosave&) = delete;
     CAutosave& operator=(const CAutosave&) = delete;
 
     /// Copies go beside this file from now on; numbers go on after those that are there. The
-    /// copies of the file before stay as they are.
+    /// copies of the file before stay as they are: Remove comes first where they are not wanted.
     void Follow(const std::string& file);
+    const std::string& File() const { return m_file; }
 
     /// Writes a copy where the document has unsaved changes that the latest copy lacks, at most
     /// every 20 s and so that writing takes a twentieth of the time at most. nowS: a clock that
@@ -42,14 +46,17 @@ public:
     /// after the interval.
     AUTOSAVE Tick(double nowS, T_FILE_ERROR& error);
 
-    /// Removes the copies of the file: it was saved, or its changes were given up.
+    /// Removes the copies of this session: the document was saved, or its changes were given up.
     void Remove();
 
-    /// Copies of a file, the newest first, damaged ones too. Empty also while another program has
-    /// one of them in use: it has not crashed.
+    /// Copies of a file that sessions which ended without removing them have left, the newest
+    /// first, damaged ones too. A session that has one of its copies in use has not ended.
     static std::vector<T_AUTOSAVE_COPY> Find(const std::string& file);
     /// The copy with the highest number whose content and checksums are right. 1 found; 0 none.
     [[nodiscard]] static int Newest(const std::string& file, T_AUTOSAVE_COPY& out);
+    /// Makes the copies of that ended session those of this one, so that Remove removes them. 1
+    /// done; 0 somebody else has taken them.
+    [[nodiscard]] int TakeOver(const T_AUTOSAVE_COPY& copy);
 
 private:
     int Write(T_FILE_ERROR& error);
@@ -59,6 +66,8 @@ private:
     long m_next = 1;
     long m_revision = -1; // of the document in the latest copy
     double m_dueS = 0.0;
-    bool m_started = false;                                // the first tick has set the clock
-    std::map<long, std::unique_ptr<CModelStore>> m_copies; // of this object, with their locks
+    bool m_started = false;                                     // the first tick has set the clock
+    std::string m_session;                                      // of this object
+    std::map<std::string, std::unique_ptr<CModelLock>> m_taken; // copies of an ended session
+    std::map<long, std::unique_ptr<CModelStore>> m_copies;      // of this object, with their locks
 };

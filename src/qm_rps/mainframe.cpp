@@ -5,6 +5,7 @@
 #include "qm_db/filectrl.h"
 
 #include <filesystem>
+#include <memory>
 
 namespace {
 
@@ -31,13 +32,26 @@ CMainFrame::CMainFrame(CDBDoc& doc, const std::string& untitled) : m_doc(doc), m
     FollowDocument();
 }
 
+std::string CMainFrame::CopiedFile() const
+{
+    if (m_readOnly) return {};
+    return m_doc.Path().empty() ? m_untitled : m_doc.Path();
+}
+
 /// The copies of the document go beside its file.
 void CMainFrame::FollowDocument()
 {
-    m_autosave.Follow(m_readOnly             ? std::string()
-                      : m_doc.Path().empty() ? m_untitled
-                                             : m_doc.Path());
+    m_autosave.Follow(CopiedFile());
     m_autosaveFailed = false;
+}
+
+/// The document may also be saved by others than this window, under another name too: an iteration
+/// does.
+void CMainFrame::FollowSaves()
+{
+    const bool isMoved = m_autosave.File() != CopiedFile();
+    if (isMoved || !m_doc.Data().IsModified()) m_autosave.Remove();
+    if (isMoved) FollowDocument();
 }
 
 int CMainFrame::OfferRecovery(const std::string& file)
@@ -45,14 +59,24 @@ int CMainFrame::OfferRecovery(const std::string& file)
     T_AUTOSAVE_COPY copy;
     if (file.empty() || !CAutosave::Newest(file, copy)) return 0;
     constexpr const char* kKey = "IDS_QM_UI_RECOVER";
-    if (!AskYesNo(kKey, MMSGFunction::Format(kKey, {NameOfFile(file == m_untitled ? "" : file),
-                                                    std::to_string(copy.sequence)})))
+    const ANSWER answer =
+        AskYesNoCancel(kKey, MMSGFunction::Format(kKey, {NameOfFile(file == m_untitled ? "" : file),
+                                                         std::to_string(copy.sequence)}));
+    if (answer == ANSWER::Cancel) return 0;
+    auto ended = std::make_unique<CAutosave>(m_doc);
+    ended->Follow(file);
+    if (!ended->TakeOver(copy)) return 0; // another window was faster
+    if (answer == ANSWER::No) {           // the person gives the changes up
+        ended->Remove();
         return 0;
+    }
     T_FILE_ERROR error;
     if (!m_doc.RecoverModel(copy.path, file == m_untitled ? std::string() : file, error))
         return Refuse(error.text);
     m_readOnly = false;
     FollowDocument();
+    ended.reset();
+    (void)!m_autosave.TakeOver(copy); // else another window has them, and removes them
     Note("IDS_QM_UI_RECOVERED", copy.path);
     return 1;
 }
@@ -66,6 +90,7 @@ int CMainFrame::OnStart(const std::vector<std::string>& files)
 
 void CMainFrame::OnTick(double nowS)
 {
+    FollowSaves();
     T_FILE_ERROR error;
     switch (m_autosave.Tick(nowS, error)) {
     case AUTOSAVE::Written:
@@ -103,6 +128,7 @@ std::string CMainFrame::SavePath() const
 /// Edits are saved or given up; false: the person wants to go on with the document.
 bool CMainFrame::MayReplace()
 {
+    FollowSaves();
     if (!m_doc.Data().IsModified()) return true;
     constexpr const char* kKey = "IDS_QM_UI_SAVE_CHANGES";
     switch (AskYesNoCancel(kKey, MMSGFunction::Format(kKey, {NameOfFile(m_doc.Path())}))) {
@@ -165,6 +191,18 @@ int CMainFrame::OnSave()
     return SavePath().empty() ? 0 : OnSaveAs(SavePath());
 }
 
+/// Where another program has changed the file meanwhile the person decides.
+int CMainFrame::Save(const std::string& path, T_FILE_ERROR& error)
+{
+    if (m_doc.SaveAs(path, error)) return 1;
+    constexpr const char* kKey = "IDS_QM_UI_SAVE_OVER_CHANGES";
+    if (error.fault != FILE_FAULT::Changed ||
+        !AskYesNo(kKey, MMSGFunction::Format(kKey, {error.text})))
+        return 0;
+    m_doc.AcceptChanges();
+    return m_doc.SaveAs(path, error);
+}
+
 int CMainFrame::OnSaveAs(const std::string& path)
 {
     std::string to = path;
@@ -175,11 +213,10 @@ int CMainFrame::OnSaveAs(const std::string& path)
             return 0;
     }
     T_FILE_ERROR error;
-    if (!m_doc.SaveAs(to, error)) return Refuse(error.text);
+    if (!Save(to, error)) return Refuse(error.text);
     m_readOnly = false;
     m_autosave.Remove(); // what they held is in the file now
     FollowDocument();
-    m_autosave.Remove(); // of a file that was replaced
     Note("IDS_QM_UI_SAVED", to);
     return 1;
 }

@@ -50,9 +50,12 @@ public:
 private:
     int Refuse(const std::string& text);
     bool MayReplace();
+    [[nodiscard]] int Save(const std::string& path, T_FILE_ERROR& error);
     int OpenModel(const std::string& path);
     int OfferRecovery(const std::string& file);
     void FollowDocument();
+    void FollowSaves();
+    std::string CopiedFile() const;
 
     CDBDoc& m_doc;
     std::string m_untitled;

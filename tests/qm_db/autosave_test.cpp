@@ -65,9 +65,17 @@ protected:
             return -1.0;
         return m_doc->Data().Model().nodes.at(1).xyz[0];
     }
+    /// Of the session that has written them all.
+    std::string CopyPath(long sequence) const
+    {
+        for (const std::string& name : m_folder.Names())
+            if (name.find(".auto-") != std::string::npos)
+                return m_folder / (name.substr(0, name.rfind('-') + 1) + std::to_string(sequence));
+        return {};
+    }
     void Damage(long sequence) const
     {
-        const std::string path = m_file + ".auto-" + std::to_string(sequence);
+        const std::string path = CopyPath(sequence);
         std::string bytes = ReadText(path);
         std::fill(bytes.begin() + 4096, bytes.end(), '\x5a'); // all pages but the first
         WriteText(path, bytes);
@@ -116,12 +124,12 @@ TEST_F(Autosave, TheCopyIsChosenByNumberAndChecksumNotByDate)
     for (const double x : {2.0, 3.0, 4.0})
         Keep(x);
     Crash();
-    fs::last_write_time(m_file + ".auto-1", fs::file_time_type::clock::now());
-    fs::last_write_time(m_file + ".auto-3", fs::file_time_type());
+    fs::last_write_time(CopyPath(1), fs::file_time_type::clock::now());
+    fs::last_write_time(CopyPath(3), fs::file_time_type());
     EXPECT_EQ(4.0, Recovered());
     Damage(3);
     EXPECT_EQ(3.0, Recovered());
-    fs::resize_file(m_file + ".auto-2", 0);
+    fs::resize_file(CopyPath(2), 0);
     EXPECT_EQ(2.0, Recovered());
     Damage(1);
     EXPECT_EQ(-1.0, Recovered());
@@ -138,6 +146,10 @@ TEST_F(Autosave, ASecondCrashDuringRecoveryLosesNothing)
     EXPECT_EQ(4.0, Recovered());
     m_autosave = std::make_unique<CAutosave>(*m_doc);
     m_autosave->Follow(m_file);
+    T_AUTOSAVE_COPY copy;
+    ASSERT_EQ(1, CAutosave::Newest(m_file, copy));
+    ASSERT_EQ(1, m_autosave->TakeOver(copy));
+    EXPECT_TRUE(Sequences().empty()) << "nobody else is asked about them";
     Keep(7.0);
     Crash(); // after a copy of the recovered document
     EXPECT_EQ((std::vector<long>{4, 3, 2}), Sequences());
@@ -159,14 +171,36 @@ TEST_F(Autosave, ADamagedOrMissingFileCanStillBeRecovered)
 TEST_F(Autosave, AFailedCopyLeavesTheOthersAndIsTriedAgain)
 {
     Keep(2.0);
-    fs::create_directory(m_file + ".auto-2"); // in the way
+    fs::create_directory(CopyPath(2)); // in the way
     Move(3.0);
     m_nowS += 100.0;
     EXPECT_EQ(AUTOSAVE::Failed, Tick(m_nowS));
     EXPECT_EQ(AUTOSAVE::Nothing, Tick(m_nowS + 1.0));
-    fs::remove(m_file + ".auto-2");
+    fs::remove(CopyPath(2));
     EXPECT_EQ(AUTOSAVE::Written, Tick(m_nowS + 100.0));
     m_autosave->Remove();
     Crash();
     EXPECT_TRUE(Sequences().empty());
+}
+
+TEST_F(Autosave, EverySessionHasItsOwnCopies)
+{
+    CDBDoc other;
+    CAutosave second(other);
+    second.Follow(m_file); // two windows on the place of models without a name
+    Keep(2.0);
+    second.Remove();
+    Crash();
+    EXPECT_EQ(2.0, Recovered()) << "the other session removed them";
+    T_AUTOSAVE_COPY copy;
+    ASSERT_EQ(1, CAutosave::Newest(m_file, copy));
+    m_autosave = std::make_unique<CAutosave>(*m_doc);
+    m_autosave->Follow(m_file);
+    Keep(3.0);
+    ASSERT_EQ(1, CAutosave::Newest(m_file, copy)) << "a running session hides them";
+    EXPECT_EQ(1, second.TakeOver(copy));
+    EXPECT_EQ(0, m_autosave->TakeOver(copy));
+    second.Remove();
+    Crash();
+    EXPECT_EQ(3.0, Recovered());
 }
