@@ -1,18 +1,15 @@
 #include "qm_db/sheetfile.h"
 
 #include "qm_base/msgfunction.h"
-#include "qm_base/neutrallocale.h"
+#include "qm_db/file/sheetparts.h"
+#include "qm_db/file/storedzip.h"
 #include "qm_db/file/storefault.h"
 #include "qm_db/filectrl.h"
 
 #include <algorithm>
 #include <cerrno>
 #include <cmath>
-#include <cstdlib>
 #include <filesystem>
-#include <memory>
-#include <unistd.h>
-#include <xlsxwriter.h>
 
 namespace fs = std::filesystem;
 
@@ -20,76 +17,6 @@ namespace {
 
 constexpr std::size_t kMaxText = 32767;
 constexpr std::size_t kMaxFormula = 8192;
-constexpr std::time_t kDate = 946684800; // 2000-01-01: the same file whenever it is written
-constexpr lxw_color_t kInputColor = 0xFFF2CC;
-constexpr const char* kCantWrite = "IDS_QM_DB_FILE_CANT_WRITE";
-
-/// A new empty file in the system's folder for such files, removed at the end.
-class CScratchFile {
-public:
-    CScratchFile() : m_path((fs::temp_directory_path() / "qm-sheet-XXXXXX").string())
-    {
-        const int descriptor = ::mkstemp(m_path.data());
-        if (descriptor < 0) ThrowSystem(kCantWrite, errno);
-        ::close(descriptor);
-    }
-    CScratchFile(const CScratchFile&) = delete;
-    CScratchFile& operator=(const CScratchFile&) = delete;
-    ~CScratchFile() { ::unlink(m_path.c_str()); }
-    const std::string& Path() const { return m_path; }
-
-private:
-    std::string m_path;
-};
-
-struct T_CLOSE_BOOK {
-    void operator()(lxw_workbook* book) const { lxw_workbook_free(book); }
-};
-using BOOK = std::unique_ptr<lxw_workbook, T_CLOSE_BOOK>;
-
-std::uint8_t EdgeCode(SHEET_EDGE edge)
-{
-    switch (edge) {
-    case SHEET_EDGE::None:
-        break;
-    case SHEET_EDGE::Thin:
-        return LXW_BORDER_THIN;
-    case SHEET_EDGE::Double:
-        return LXW_BORDER_DOUBLE;
-    }
-    return LXW_BORDER_NONE;
-}
-
-/// Formats of a workbook, one for each style.
-class CFormats {
-public:
-    explicit CFormats(lxw_workbook* book) : m_book(book) {}
-    lxw_format* Get(const T_SHEET_STYLE& style)
-    {
-        if (style == T_SHEET_STYLE{}) return nullptr;
-        lxw_format*& format = m_formats[style];
-        if (!format) format = Make(style);
-        return format;
-    }
-
-private:
-    lxw_format* Make(const T_SHEET_STYLE& style) const
-    {
-        lxw_format* format = workbook_add_format(m_book);
-        if (style.centred) format_set_align(format, LXW_ALIGN_CENTER);
-        if (style.bold) format_set_bold(format);
-        if (style.input) format_set_bg_color(format, kInputColor);
-        if (!style.numberFormat.empty()) format_set_num_format(format, style.numberFormat.c_str());
-        format_set_left(format, EdgeCode(style.left));
-        format_set_right(format, EdgeCode(style.right));
-        format_set_top(format, EdgeCode(style.top));
-        format_set_bottom(format, EdgeCode(style.bottom));
-        return format;
-    }
-
-    lxw_workbook* m_book;
-    std::map<T_SHEET_STYLE, lxw_format*> m_formats;
-};
 
 [[noreturn]] void RefuseCell(SHEET_AT at, const char* reason)
 {
@@ -144,52 +71,19 @@ void CheckNotOpen(const std::string& path)
     }
 }
 
-lxw_error PutCell(lxw_worksheet* page, SHEET_AT at, const SHEET_VALUE& value, lxw_format* format)
-{
-    const auto row = static_cast<lxw_row_t>(at.first);
-    const auto column = static_cast<lxw_col_t>(at.second);
-    if (const auto* text = std::get_if<std::string>(&value); text && !text->empty())
-        return worksheet_write_string(page, row, column, text->c_str(), format);
-    if (const auto* number = std::get_if<double>(&value))
-        return worksheet_write_number(page, row, column, *number, format);
-    if (const auto* formula = std::get_if<T_SHEET_FORMULA>(&value))
-        return worksheet_write_formula_num(page, row, column, formula->text.c_str(), format,
-                                           formula->value);
-    return worksheet_write_blank(page, row, column, format);
-}
-
-void Require(lxw_error code)
-{
-    if (code == LXW_NO_ERROR) return;
-    throw CStoreFault(FILE_FAULT::NoAccess, kCantWrite, lxw_strerror(code));
-}
-
-void FillBook(lxw_workbook* book, const T_SHEET& sheet)
-{
-    lxw_doc_properties properties{};
-    properties.created = kDate;
-    Require(workbook_set_properties(book, &properties));
-    lxw_worksheet* page = workbook_add_worksheet(book, sheet.name.c_str());
-    if (!page) throw CStoreFault(FILE_FAULT::BadInput, "IDS_QM_DB_SHEET_NAME", sheet.name);
-    for (const T_SHEET_WIDTH& w : sheet.widths)
-        Require(worksheet_set_column(page, static_cast<lxw_col_t>(w.firstColumn),
-                                     static_cast<lxw_col_t>(w.lastColumn), w.characters, nullptr));
-    CFormats formats(book);
-    for (const auto& [at, cell] : sheet.cells)
-        Require(PutCell(page, at, cell.value, formats.Get(cell.style)));
-}
-
+/// In memory: a disk can be full only while the file itself is written, which says so.
 std::string BytesOf(const T_SHEET& sheet)
 {
-    const CScratchFile scratch;
-    BOOK book(workbook_new(scratch.Path().c_str()));
-    if (!book) ThrowSystem(kCantWrite, ENOMEM);
-    FillBook(book.get(), sheet);
-    Require(workbook_close(book.release())); // it frees the book whatever happens
-    std::string bytes;
-    T_FILE_ERROR error;
-    if (!CFileCtrl::ReadWholeFile(scratch.Path(), bytes, error)) ThrowSystem(kCantWrite, EIO);
-    return bytes;
+    const SHEET_FORMATS formats = SheetFormats(sheet);
+    CStoredZip zip;
+    bool fits = true;
+    for (const T_SHEET_PART& part : kFixedSheetParts)
+        fits = fits && zip.Add(part.name, part.text);
+    fits = fits && zip.Add("xl/workbook.xml", WorkbookPart(sheet)) &&
+           zip.Add("xl/styles.xml", StylesPart(formats)) &&
+           zip.Add("xl/worksheets/sheet1.xml", WorksheetPart(sheet, formats));
+    if (!fits) ThrowSystem("IDS_QM_DB_FILE_CANT_WRITE", EFBIG);
+    return zip.Take();
 }
 
 void Mark(T_SHEET& sheet, const T_SHEET_BLOCK& b, SHEET_EDGE T_SHEET_STYLE::*side, SHEET_EDGE edge)
@@ -240,7 +134,6 @@ int WriteSheet(const std::string& path, const T_SHEET& sheet, T_FILE_ERROR& erro
         if (!CFileCtrl::CheckOutput({path, OUTPUT_KIND::Sheet}, error)) return 0;
         CheckSheet(sheet);
         CheckNotOpen(path);
-        const CNeutralLocale neutral; // the library formats numbers by the locale
         return CFileCtrl::WriteWholeFile(path, BytesOf(sheet), error);
     } catch (const CStoreFault& fault) {
         error = fault.ForFile(path);
