@@ -15,6 +15,14 @@ if(QM_SANITIZE)
   target_link_options(qm_flags INTERFACE -fsanitize=${QM_SANITIZE})
 endif()
 
+# Optimised programs are hardened: what is read may have been made by anybody.
+set(hardened $<AND:$<CONFIG:Release>,$<BOOL:${UNIX}>,$<NOT:$<BOOL:${QM_SANITIZE}>>>)
+target_compile_options(qm_flags INTERFACE
+  $<${hardened}:-fPIE> $<${hardened}:-fstack-protector-strong>
+  $<${hardened}:-U_FORTIFY_SOURCE> $<${hardened}:-D_FORTIFY_SOURCE=2>)
+target_link_options(qm_flags INTERFACE
+  $<${hardened}:-pie> $<${hardened}:LINKER:-z,relro> $<${hardened}:LINKER:-z,now>)
+
 # qm_room(<name> SOURCES a.cpp ... [DEPENDS qm::x ...] [PRIVATE_DEPENDS lib ...])
 # makes the static library <name> with the alias qm::<short name>.
 function(qm_room name)

@@ -1,5 +1,6 @@
 #include "iteratecommands.h"
 
+#include "console/console.h"
 #include "inputfile.h"
 #include "output.h"
 #include "qm_base/say.h"
@@ -15,24 +16,11 @@
 #endif
 
 #include <algorithm>
-#include <atomic>
-#include <csignal>
 #include <cstdio>
 #include <filesystem>
 #include <unistd.h>
 
 namespace {
-
-std::atomic<bool> g_cancel{false}; // set by an interrupt
-
-/// While it lives, an interrupt ends the run; the iteration at hand is taken back.
-struct T_INTERRUPT {
-    T_INTERRUPT() : before(std::signal(SIGINT, [](int) { g_cancel = true; })) {}
-    ~T_INTERRUPT() { std::signal(SIGINT, before); }
-    T_INTERRUPT(const T_INTERRUPT&) = delete;
-    T_INTERRUPT& operator=(const T_INTERRUPT&) = delete;
-    void (*before)(int);
-};
 
 /// Wants every iteration, and the report as the options say; shows a line on a terminal that
 /// changes with each iteration.
@@ -50,7 +38,7 @@ public:
                 false);
         }
         m_shown = done;
-        return !g_cancel;
+        return !CInterrupt::IsAsked();
     }
 
 private:
@@ -78,6 +66,13 @@ constexpr T_END_WORDS kEnds[] = {
     {ULF_ITER_END::NotAnalysed, "not analysed", "IDS_QM_CLI_NOT_ANALYSED", EXIT_CODE::BadInput},
 };
 
+T_END_WORDS WordsOfEnd(ULF_ITER_END end)
+{
+    for (const T_END_WORDS& words : kEnds)
+        if (words.end == end) return words;
+    return kEnds[0];
+}
+
 T_END_WORDS WordsOf(const CUlfIteration& run, const T_ITERATE_OPTIONS& o, bool met)
 {
     const bool done = run.End() == ULF_ITER_END::Required ? o.iterations == 0
@@ -87,9 +82,7 @@ T_END_WORDS WordsOf(const CUlfIteration& run, const T_ITERATE_OPTIONS& o, bool m
                 EXIT_CODE::NotFound};
     if (run.End() == ULF_ITER_END::Required && o.iterations == 0)
         return {run.End(), "solved", "IDS_QM_CLI_SOLVED", EXIT_CODE::Done};
-    for (const T_END_WORDS& words : kEnds)
-        if (words.end == run.End()) return words;
-    return kEnds[0];
+    return WordsOfEnd(run.End());
 }
 
 void Write(CJsonText& w, const T_ULF_ITER_STEP& step)
@@ -191,17 +184,18 @@ EXIT_CODE RunUlfIterate(const T_ITERATE_OPTIONS& o)
     if (!settings || !settings->Set({o.iterations, o.tolerance}))
         return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_ITERATE_REFUSED"));
     CUlfIteration run(host, person, settings->Settings());
-    const T_INTERRUPT interrupt;
+    const CInterrupt interrupt;
     const int done = run.Run();
     if (isatty(STDERR_FILENO) && run.History().size() > 1) std::fprintf(stderr, "\n");
     const auto& result = host.Result();
     const bool met = result && std::ranges::all_of(UlfResultRows(*result), &T_ULF_RESULT_ROW::met);
-    const T_END_WORDS words = WordsOf(run, o, met);
+    const T_END_WORDS words =
+        host.IsSaveRefused() ? WordsOfEnd(ULF_ITER_END::NotSaved) : WordsOf(run, o, met);
     const std::string said = run.Said() ? run.Said()->text : std::string();
     const std::string reason = host.Error().empty() ? said : host.Error();
     if (!done || words.code != EXIT_CODE::Done)
-        Complain(words.code,
-                 o.file + ": " + Say(words.key) + (reason.empty() ? "" : ": " + reason));
+        Complain(words.code, Say("IDS_QM_CLI_FILE_ITEM", o.file, o.item) + ": " + Say(words.key) +
+                                 (reason.empty() ? "" : ": " + reason));
     const EXIT_CODE written = WriteResults(run, o, words.status);
     return words.code == EXIT_CODE::Done ? written : words.code;
 }

@@ -1,4 +1,5 @@
 // qm-rps: the command line. Reads the arguments; the commands do the work.
+#include "console/console.h"
 #include "output.h"
 #include "qm_base/msgfunction.h"
 #include "qm_base/say.h"
@@ -35,6 +36,7 @@ void ChooseLanguage(int argc, char** argv)
 int main(int argc, char** argv)
 {
     ChooseLanguage(argc, argv);
+    const CConsole console;
     CLI::App app{"", "qm-rps"};
     std::signal(SIGXFSZ, SIG_IGN); // a file-size limit is a write error, not the end
     EXIT_CODE code = EXIT_CODE::Done;
@@ -61,7 +63,7 @@ int main(int argc, char** argv)
                                          : ParserWords(e.what());
         return ToInt(Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_SEE_HELP", what)));
     }
-    if (std::fflush(stdout) != 0 || std::ferror(stdout) != 0) {
+    if (!CConsole::Flush()) {
         return ToInt(Complain(EXIT_CODE::NoAccess, Say("IDS_QM_CLI_NO_STDOUT")));
     }
     return ToInt(code);

@@ -1,7 +1,9 @@
 #include "output.h"
 
+#include "console/console.h"
 #include "inputfile.h"
 #include "qm_base/say.h"
+#include "qm_base/visibletext.h"
 
 #ifdef QM_UI
 #include "qm_ui/plot/plotfile.h"
@@ -11,13 +13,13 @@
 
 EXIT_CODE Complain(EXIT_CODE code, const std::string& text)
 {
-    std::fprintf(stderr, "qm-rps: %s\n", text.c_str());
+    std::fprintf(stderr, "qm-rps: %s\n", VisibleLine(text).c_str());
     return code;
 }
 
 void ShowOnTerminal(const std::string& text, bool last)
 {
-    std::fprintf(stderr, "\rqm-rps: %s%s", text.c_str(), last ? "\n" : "");
+    std::fprintf(stderr, "\rqm-rps: %s%s", VisibleLine(text).c_str(), last ? "\n" : "");
     std::fflush(stderr);
 }
 
@@ -46,8 +48,7 @@ EXIT_CODE CheckOutputs(const std::string& input, const std::vector<T_OUTPUT>& ou
 EXIT_CODE WriteOutput(const std::string& path, std::string_view text)
 {
     if (path == "-") {
-        const bool whole = std::fwrite(text.data(), 1, text.size(), stdout) == text.size();
-        return whole && std::fflush(stdout) == 0
+        return CConsole::WriteRaw(text)
                    ? EXIT_CODE::Done
                    : Complain(EXIT_CODE::NoAccess, Say("IDS_QM_CLI_NO_STDOUT"));
     }

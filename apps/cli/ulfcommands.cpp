@@ -25,6 +25,12 @@
 
 namespace {
 
+/// What messages about the item begin with.
+std::string ItemOf(const T_ULF_OPTIONS& o)
+{
+    return Say("IDS_QM_CLI_FILE_ITEM", o.file, o.item);
+}
+
 EXIT_CODE OpenItem(const T_ULF_OPTIONS& o, T_ULF_OPENED& in)
 {
     return OpenUlfItem(o.file, o.item, o.sumStageLoads, in);
@@ -40,7 +46,7 @@ EXIT_CODE OpenAndAnalyse(const T_ULF_OPTIONS& o, T_ULF_OPENED& in)
 EXIT_CODE SolveOpened(const T_ULF_OPTIONS& o, T_ULF_OPENED& in)
 {
     const T_ULF_OUTCOME outcome = SolveUlf(*in.dialog);
-    if (outcome.code != EXIT_CODE::Done) Complain(outcome.code, o.file + ": " + outcome.message);
+    if (outcome.code != EXIT_CODE::Done) Complain(outcome.code, ItemOf(o) + ": " + outcome.message);
     return in.dialog->Result() ? EXIT_CODE::Done : outcome.code;
 }
 
@@ -209,7 +215,7 @@ EXIT_CODE RunUlfSolve(const T_ULF_OPTIONS& o)
     if (const EXIT_CODE code = AnalyseForUlf(o.file, in); code != EXIT_CODE::Done) return code;
     const T_ULF_OUTCOME outcome = SolveUlf(*in.dialog);
     const auto& result = in.dialog->Result();
-    if (outcome.code != EXIT_CODE::Done) Complain(outcome.code, o.file + ": " + outcome.message);
+    if (outcome.code != EXIT_CODE::Done) Complain(outcome.code, ItemOf(o) + ": " + outcome.message);
     if (!o.json.empty()) {
         const EXIT_CODE code = WriteOutput(o.json, UlfJson(outcome, result));
         if (code != EXIT_CODE::Done) return code;
@@ -233,13 +239,14 @@ EXIT_CODE RunUlfExplain(const T_ULF_OPTIONS& o)
     const std::function<bool(int, int)> progress =
         isatty(STDERR_FILENO) ? ShowSearch : std::function<bool(int, int)>();
     if (!run || !ExplainUlf(*run, in.doc.Unit().Units(), explained, progress))
-        return Complain(outcome.code, o.file + ": " + outcome.message);
+        return Complain(outcome.code, ItemOf(o) + ": " + outcome.message);
     if (!o.json.empty()) {
         const EXIT_CODE code = WriteOutput(o.json, ExplainJson(explained));
         if (code != EXIT_CODE::Done) return code;
     }
     for (const std::string& line : explained.lines)
         if (o.json != "-") std::printf("%s\n", line.c_str());
+    if (outcome.code != EXIT_CODE::Done) Complain(outcome.code, ItemOf(o) + ": " + outcome.message);
     return outcome.code;
 }
 
@@ -287,8 +294,12 @@ EXIT_CODE RunUlfCombine(const T_ULF_OPTIONS& o)
     (void)TakeMessageHistory(); // what the calculation has left
     const int made = dialog.OnMakeCombination();
     const std::vector<std::string> history = TakeMessageHistory();
-    for (const std::string& line : history)
-        std::fprintf(made ? stdout : stderr, "%s%s\n", made ? "" : "qm-rps: ", line.c_str());
+    for (const std::string& line : history) {
+        if (made)
+            std::printf("%s\n", line.c_str());
+        else
+            Complain(EXIT_CODE::Usage, line);
+    }
     if (!made) return EXIT_CODE::Usage;
     return SaveDocument(in.doc, o.out.empty() ? o.file : o.out);
 }

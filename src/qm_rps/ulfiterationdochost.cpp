@@ -48,7 +48,8 @@ int CUlfIterationDocHost::Solve(std::vector<T_ULF_ITER_ROW>& rows, std::optional
 int CUlfIterationDocHost::SaveCopy(const std::string& path)
 {
     T_FILE_ERROR error;
-    return m_doc.SaveAs(path, error) ? 1 : Refuse(error.text);
+    m_isSaveRefused = !m_doc.SaveAs(path, error);
+    return m_isSaveRefused ? Refuse(error.text) : 1;
 }
 
 int CUlfIterationDocHost::StartEdit(const std::string& title)

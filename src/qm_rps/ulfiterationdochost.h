@@ -33,6 +33,8 @@ public:
     /// Also false when the latest analysis failed or its results were not saved.
     bool IsPostMode() override { return m_isAnalysed && m_doc.IsPostMode(); }
 
+    /// Whether the latest save was refused: a full disk is not a failure of the analysis.
+    bool IsSaveRefused() const { return m_isSaveRefused; }
     /// Why the latest operation was refused, in words.
     const std::string& Error() const { return m_error; }
     /// Of the latest solution.
@@ -50,6 +52,7 @@ private:
     std::vector<std::size_t> m_unknowns; // rows of the item, of the latest problem
     std::optional<T_ULF_RESULT> m_result;
     std::string m_error;
+    bool m_isSaveRefused = false;
     bool m_isScaled = false;                 // the latest edit has changed a load
     bool m_isAnalysed = true;                // the latest analysis has its results, in the file too
     std::shared_ptr<IStagedResult> m_before; // results before the latest edit
