@@ -39,6 +39,16 @@ bool AddExtras(CPushOverCurveDlg& driver, const T_EVALUATE_OPTIONS& options)
     return true;
 }
 
+/// Why the results of this push could not be read (a damaged block); empty when they could.
+std::string ReadFault(CDBDoc& doc, const std::string& push)
+{
+    int key = 0;
+    if (!doc.Attr().FindPolc(push, key)) return {};
+    const T_RESULT_MAP& results = doc.Data().Content().results;
+    const auto it = results.find(key);
+    return it == results.end() ? std::string() : it->second->Error();
+}
+
 /// Evaluates what was asked for; false after a message on stderr.
 EXIT_CODE EvaluateAll(CDBDoc& doc, const T_EVALUATE_OPTIONS& options,
                       std::vector<T_PUSH_EVALUATION>& out)
@@ -54,6 +64,8 @@ EXIT_CODE EvaluateAll(CDBDoc& doc, const T_EVALUATE_OPTIONS& options,
                             doc.Path() + ": " + Say("IDS_QM_CLI_EVALUATION_QUOTED", eval.name) +
                                 ": " + driver.Refusal().text);
         driver.Evaluate();
+        if (const std::string fault = ReadFault(doc, eval.push); !fault.empty())
+            return Complain(EXIT_CODE::BadInput, fault);
         if (!AddExtras(driver, options)) return EXIT_CODE::Usage;
         out.push_back(driver.Result());
     }
@@ -143,6 +155,8 @@ EXIT_CODE RunCompare(const T_COMPARE_OPTIONS& o)
     T_FINDING refusal;
     if (!ComparePushover(evaluator, o.push, o.spectrum, o.behavior, comparison, refusal))
         return Complain(EXIT_CODE::Usage, o.file + ": " + refusal.text);
+    if (const std::string fault = ReadFault(doc, o.push); !fault.empty())
+        return Complain(EXIT_CODE::BadInput, fault);
     EXIT_CODE code = EXIT_CODE::Done;
     if (!o.json.empty()) code = WriteOutput(o.json, ResultJson(comparison.results));
 #ifdef QM_UI
