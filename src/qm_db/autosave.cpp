@@ -2,6 +2,7 @@
 
 #include "qm_base/textformat.h"
 #include "qm_db/dbdoc.h"
+#include "qm_db/file/foldernames.h"
 #include "qm_db/file/storefault.h"
 #include "qm_db/store/modellock.h"
 
@@ -49,12 +50,8 @@ std::optional<T_AUTOSAVE_COPY> ParseCopy(std::string_view text)
 std::vector<T_AUTOSAVE_COPY> AllCopies(const std::string& file)
 {
     std::vector<T_AUTOSAVE_COPY> copies;
-    const fs::path path(file);
-    const fs::path folder = path.has_parent_path() ? path.parent_path() : fs::path(".");
-    const std::string begin = path.filename().string() + std::string(kMark);
-    std::error_code none;
-    for (fs::directory_iterator it(folder, none), end; !none && it != end; it.increment(none)) {
-        const std::string name = it->path().filename().string();
+    const std::string begin = fs::path(file).filename().string() + std::string(kMark);
+    for (const std::string& name : NamesBeside(file)) {
         if (!name.starts_with(begin)) continue;
         std::optional<T_AUTOSAVE_COPY> copy =
             ParseCopy(std::string_view(name).substr(begin.size()));
@@ -115,13 +112,29 @@ AUTOSAVE CAutosave::Tick(double nowS, T_FILE_ERROR& error)
     return done ? AUTOSAVE::Written : AUTOSAVE::Failed;
 }
 
-/// The new copy is verified (CModelStore::Save) before the oldest ones go.
 int CAutosave::Write(T_FILE_ERROR& error)
 {
-    auto store = std::make_unique<CModelStore>();
-    const std::string path = CopyPath(m_file, m_session, m_next);
-    if (!store->Save(path, m_doc.Data().Content(), error)) return 0;
-    m_copies[m_next++] = std::move(store);
+    auto copy = m_copies.end();
+    T_FILE_ERROR refusal, ignored;
+    int isSaved = 0;
+    const int isTried = Guarded(m_file, error, [&] {
+        copy = m_copies.emplace(m_next, std::make_unique<CModelStore>()).first;
+        const std::string path = CopyPath(m_file, m_session, m_next);
+        isSaved = copy->second->Save(path, m_doc.Data().Content(), refusal);
+    });
+    if (isTried && !isSaved) error = std::move(refusal);
+    if (!isSaved) {
+        if (copy != m_copies.end()) m_copies.erase(copy);
+        return 0;
+    }
+    ++m_next;
+    (void)!Guarded(m_file, ignored, [&] { RemoveOld(); }); // they go next time
+    return 1;
+}
+
+/// The new copy was verified (CModelStore::Save) before the oldest ones go.
+void CAutosave::RemoveOld()
+{
     std::size_t kept = 0;
     for (const T_AUTOSAVE_COPY& copy : AllCopies(m_file)) {
         const bool isTaken = m_taken.contains(copy.path);
@@ -130,7 +143,6 @@ int CAutosave::Write(T_FILE_ERROR& error)
         m_taken.erase(copy.path);
         m_copies.erase(copy.sequence);
     }
-    return 1;
 }
 
 /// Files first: until they are gone nobody else may take them for those of a crash.

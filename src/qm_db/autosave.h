@@ -60,6 +60,7 @@ public:
 
 private:
     int Write(T_FILE_ERROR& error);
+    void RemoveOld();
 
     CDBDoc& m_doc;
     std::string m_file;

@@ -87,12 +87,12 @@ std::string TargetOf(const std::string& path)
 }
 
 /// Devices and pipes have no old content to keep.
-int WriteSpecial(const std::string& path, std::string_view text, T_FILE_ERROR& error)
+void WriteSpecial(const std::string& path, std::string_view text)
 {
     std::FILE* const file = std::fopen(path.c_str(), "we");
-    if (!file) return Refuse(path, kCantWrite, errno, error);
-    const bool whole = std::fwrite(text.data(), 1, text.size(), file) == text.size();
-    return std::fclose(file) == 0 && whole ? 1 : Refuse(path, kCantWrite, errno, error);
+    if (!file) ThrowSystem(kCantWrite, errno);
+    const bool isWhole = std::fwrite(text.data(), 1, text.size(), file) == text.size();
+    if (std::fclose(file) != 0 || !isWhole) ThrowSystem(kCantWrite, errno);
 }
 
 } // namespace
@@ -104,47 +104,34 @@ std::string CFileCtrl::GetFilePathAndNameWithoutExtension(const std::string& pat
 
 int CFileCtrl::WriteWholeFile(const std::string& path, std::string_view text, T_FILE_ERROR& error)
 {
-    const CSizeSignalBlock block;
-    const std::string target = TargetOf(path);
-    struct stat old {};
-    const bool exists = stat(target.c_str(), &old) == 0;
-    if (exists && S_ISDIR(old.st_mode)) return Refuse(path, kCantWrite, EISDIR, error);
-    if (exists && !S_ISREG(old.st_mode)) return WriteSpecial(target, text, error);
-    if (exists && access(target.c_str(), W_OK) != 0) return Refuse(path, kCantWrite, errno, error);
-
-    try {
+    return Guarded(path, error, [&] {
+        const CSizeSignalBlock block;
+        const std::string target = TargetOf(path);
+        struct stat old {};
+        const bool exists = stat(target.c_str(), &old) == 0;
+        if (exists && S_ISDIR(old.st_mode)) ThrowSystem(kCantWrite, EISDIR);
+        if (exists && !S_ISREG(old.st_mode)) return WriteSpecial(target, text);
+        if (exists && access(target.c_str(), W_OK) != 0) ThrowSystem(kCantWrite, errno);
         CNewFile file(target, kCantWrite);
         file.Write(text);
         file.Flush();
         (void)file.ReplaceTarget();
-        return 1;
-    } catch (const CStoreFault& fault) {
-        error = fault.ForFile(path);
-    } catch (const std::exception& fault) {
-        error = {FILE_FAULT::NoAccess, path + ": " + fault.what()};
-    }
-    return 0;
+    });
 }
 
 int CFileCtrl::UpdateWholeFile(const std::string& path, std::string_view text,
                                std::uint64_t sumBefore, T_FILE_ERROR& error)
 {
-    try {
-        std::unique_ptr<CModelLock> lock;
-        std::string now;
-        if (std::filesystem::exists(path)) {
-            lock = CModelLock::Take(path);
-            if (!ReadWholeFile(path, now, error)) return 0;
-            if (SumOf(now) != sumBefore)
-                throw CStoreFault(FILE_FAULT::Changed, "IDS_QM_DB_FILE_CHANGED");
-        }
-        return WriteWholeFile(path, text, error);
-    } catch (const CStoreFault& fault) {
-        error = fault.ForFile(path);
-    } catch (const std::exception& fault) {
-        error = {FILE_FAULT::NoAccess, path + ": " + fault.what()};
-    }
-    return 0;
+    std::unique_ptr<CModelLock> lock;
+    std::string now;
+    const int isSame = Guarded(path, error, [&] {
+        T_FILE_ERROR fault;
+        if (!std::filesystem::exists(path)) return;
+        lock = CModelLock::Take(path);
+        if (!ReadWholeFile(path, now, fault) || SumOf(now) != sumBefore)
+            throw CStoreFault(FILE_FAULT::Changed, "IDS_QM_DB_FILE_CHANGED");
+    });
+    return isSame ? WriteWholeFile(path, text, error) : 0;
 }
 
 std::uint64_t CFileCtrl::SumOf(std::string_view text)

@@ -15,22 +15,6 @@ namespace fs = std::filesystem;
 
 namespace {
 
-/// The door of this room: runs `work`; what it throws becomes the error.
-template <class F>
-int Guarded(const std::string& path, T_FILE_ERROR& error, const F& work)
-{
-    try {
-        work();
-        error = {};
-        return 1;
-    } catch (const CStoreFault& fault) {
-        error = fault.ForFile(path);
-    } catch (const std::exception& fault) {
-        error = {FILE_FAULT::NoAccess, path + ": " + fault.what()};
-    }
-    return 0;
-}
-
 /// The file behind a link, so that a save replaces the file and not the link.
 std::string RealPath(const std::string& path)
 {

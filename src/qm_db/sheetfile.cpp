@@ -130,15 +130,14 @@ void EdgeRight(T_SHEET& sheet, const T_SHEET_BLOCK& block, SHEET_EDGE edge)
 
 int WriteSheet(const std::string& path, const T_SHEET& sheet, T_FILE_ERROR& error)
 {
-    try {
-        if (!CFileCtrl::CheckOutput({path, OUTPUT_KIND::Sheet}, error)) return 0;
+    std::string bytes;
+    T_FILE_ERROR refusal;
+    const int isTried = Guarded(path, error, [&] {
+        if (!CFileCtrl::CheckOutput({path, OUTPUT_KIND::Sheet}, refusal)) return;
         CheckSheet(sheet);
         CheckNotOpen(path);
-        return CFileCtrl::WriteWholeFile(path, BytesOf(sheet), error);
-    } catch (const CStoreFault& fault) {
-        error = fault.ForFile(path);
-    } catch (const std::exception& fault) {
-        error = {FILE_FAULT::NoAccess, path + ": " + fault.what()};
-    }
-    return 0;
+        bytes = BytesOf(sheet);
+    });
+    if (isTried && bytes.empty()) error = std::move(refusal);
+    return bytes.empty() ? 0 : CFileCtrl::WriteWholeFile(path, bytes, error);
 }

@@ -1,5 +1,6 @@
 #include "qm_db/file/newfile.h"
 
+#include "qm_db/file/foldernames.h"
 #include "qm_db/file/storefault.h"
 
 #include <atomic>
@@ -9,10 +10,7 @@
 #include <cstdio>
 #include <ctime>
 #include <fcntl.h>
-#include <filesystem>
 #include <unistd.h>
-
-namespace fs = std::filesystem;
 
 namespace {
 
@@ -37,12 +35,6 @@ bool Exists(const std::string& path)
 {
     struct stat status = {};
     return ::stat(path.c_str(), &status) == 0;
-}
-
-std::string FolderOf(const std::string& path)
-{
-    const std::string folder = fs::path(path).parent_path().string();
-    return folder.empty() ? "." : folder;
 }
 
 /// "frame.qmdb.qm.tmp-123-4" gives 123; a name of another pattern gives 0.
@@ -142,12 +134,15 @@ CFileHandle CNewFile::ReplaceTarget()
     return std::move(m_file);
 }
 
-void CNewFile::SweepBeside(const std::string& path)
+void CNewFile::SweepBeside(const std::string& path) noexcept
 {
-    std::error_code ignored; // what can't be read or removed stays
-    for (fs::directory_iterator it(FolderOf(path), ignored), end; !ignored && it != end;
-         it.increment(ignored)) {
-        const pid_t process = ProcessOf(it->path().filename().string());
-        if (process > 0 && IsStale(it->path().string(), process)) ::unlink(it->path().c_str());
+    try {
+        for (const std::string& name : NamesBeside(path)) {
+            const pid_t process = ProcessOf(name);
+            const std::string whole = FolderOf(path) + '/' + name;
+            if (process > 0 && IsStale(whole, process)) ::unlink(whole.c_str());
+        }
+    } catch (const std::exception&) {
+        // what can't be read or removed stays for the next one
     }
 }

@@ -27,7 +27,7 @@ public:
     /// Removes what writers that were killed have left in the folder of this file: files of the
     /// name pattern that nobody has locked, and whose process is gone or that are older than ten
     /// minutes.
-    static void SweepBeside(const std::string& path);
+    static void SweepBeside(const std::string& path) noexcept;
 
 private:
     void TakeOldPermissions() const;

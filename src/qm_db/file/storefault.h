@@ -32,3 +32,19 @@ private:
 std::string SystemReason(int errorNumber);
 /// NoAccess with the text of the system's error number as the detail.
 [[noreturn]] void ThrowSystem(const char* key, int errorNumber);
+
+/// The door of this room: runs `work`; what it throws becomes the error. 1 done, 0 refused.
+template <class F>
+int Guarded(const std::string& path, T_FILE_ERROR& error, const F& work)
+{
+    try {
+        work();
+        error = {};
+        return 1;
+    } catch (const CStoreFault& fault) {
+        error = fault.ForFile(path);
+    } catch (const std::exception& fault) {
+        error = {FILE_FAULT::NoAccess, path + ": " + fault.what()};
+    }
+    return 0;
+}
