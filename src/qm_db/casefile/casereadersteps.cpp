@@ -9,6 +9,10 @@ namespace {
 
 using T_SERIES = std::vector<double>;
 
+constexpr std::array<const char*, 2> kDecimalNames{"point", "comma"};
+constexpr std::array<RECORDER_DECIMAL, 2> kDecimals{RECORDER_DECIMAL::Point,
+                                                    RECORDER_DECIMAL::Comma};
+
 /// Reads one series of values per step, in the file's units, from `in` into `out`.
 class ISeriesSource {
 public:
@@ -27,8 +31,12 @@ class CRecorderSource : public ISeriesSource {
 public:
     CRecorderSource(CJsonReader& files, const std::string& folder) : m_folder(folder)
     {
-        files.GetIf("skip_rows", m_skipRows);
-        files.Check("skip_rows", m_skipRows >= 0, "IDS_QM_CASE_SKIP_ROWS");
+        files.GetIf("skip_rows", m_options.skipRows);
+        files.Check("skip_rows", m_options.skipRows >= 0, "IDS_QM_CASE_SKIP_ROWS");
+        if (files.Has("decimal")) {
+            const int at = files.Choice("decimal", kDecimalNames, "IDS_QM_CHOICE_DECIMAL");
+            m_options.decimal = kDecimals[static_cast<std::size_t>(at)];
+        }
         if (files.Has("first_row")) {
             files.Choice("first_row", std::array{kStateBeforePush}, "IDS_QM_CHOICE_FIRST_ROW");
             m_subtractFirst = true;
@@ -55,7 +63,7 @@ private:
         if (in.Failed()) return nullptr;
         CRecorderFile& file = m_files[path];
         T_FILE_ERROR error;
-        if (!file.IsLoaded() && !file.Load(m_folder, path, m_skipRows, error)) {
+        if (!file.IsLoaded() && !file.Load(m_folder, path, m_options, error)) {
             in.FailWith(error.text, error.fault);
             return nullptr;
         }
@@ -109,7 +117,7 @@ private:
     }
 
     std::string m_folder;
-    int m_skipRows = 0;
+    CRecorderFile::T_OPTIONS m_options;
     bool m_subtractFirst = false;
     std::map<std::string, CRecorderFile> m_files; // by the path in the case file
     std::string m_firstPath;                      // the others have as many rows
@@ -177,7 +185,8 @@ void ReadSteps(CJsonReader& steps, const std::string& folder, const T_MODEL& mod
     }
     steps.Keys({"files"});
     CJsonReader files = steps.Member("files");
-    files.Keys({"skip_rows", "first_row", "load_factor", "base_reaction", "displacement"});
+    files.Keys(
+        {"skip_rows", "first_row", "decimal", "load_factor", "base_reaction", "displacement"});
     CRecorderSource source(files, folder);
     ReadTables(files, source, model, push, out);
 }

@@ -8,12 +8,14 @@
 
 namespace {
 
-std::vector<double> ColumnOf(const std::string& text, int column, int skipRows = 0)
+using enum RECORDER_DECIMAL;
+
+std::vector<double> ColumnOf(const std::string& text, int column, RECORDER_DECIMAL decimal = Auto)
 {
     CRecorderFile file;
-    file.Parse(text, "r.out", skipRows);
-    std::vector<double> values(file.RowCount(), 0.0);
     T_FILE_ERROR error;
+    EXPECT_EQ(1, file.Parse(text, "r.out", {0, decimal}, error)) << error.text;
+    std::vector<double> values(file.RowCount(), 0.0);
     EXPECT_EQ(1, file.AddColumn(column, values, error)) << error.text;
     return values;
 }
@@ -23,9 +25,15 @@ using T_V = std::vector<double>;
 TEST(RecorderFile, ReadsEverySeparatorAndLineEnd)
 {
     const char* const texts[] = {
-        "1 2 3\n4 5 6\n",          "1\t2\t3\r\n4\t5\t6\r\n",
-        " 1, 2 ,3\n\n4 5,\t6,\n",  "# solver 1\n+1 2e0 3\n4 5. 6\n",
-        "t  a  b\n1 2 3\n4 5 6\n", "time, Disp X, \"Disp Y\"\n1,2,3\n4,5,6\n",
+        "1 2 3\n4 5 6\n",
+        "1\t2\t3\r\n4\t5\t6\r\n",
+        " 1, 2 ,3\n\n4 ,5,\t6,\n",
+        "# solver 1\n+1 2e0 3\n4 5. 6.\n",
+        "1 2 3\r4 5 6\r",
+        "\xEF\xBB\xBF"
+        "1; 2;3\n4;5 ;6",
+        "t  a  b\n1 2 3\n4 5 6\n",
+        "time, Disp X, \"Disp Y\"\n1,2,3\n4,5,6\n",
     };
     for (const char* text : texts) {
         EXPECT_EQ((T_V{1, 4}), ColumnOf(text, 1)) << text;
@@ -35,12 +43,81 @@ TEST(RecorderFile, ReadsEverySeparatorAndLineEnd)
     EXPECT_EQ((T_V{2, 6}), ColumnOf("1,,2\n4,,6\n", 3)); // an empty cell keeps its column
 }
 
+TEST(RecorderFile, UnderstandsADecimalCommaBesideOtherSeparators)
+{
+    struct T_ROW {
+        const char* text;
+        RECORDER_DECIMAL decimal;
+        T_V second; // column
+    };
+    const T_ROW rows[] = {
+        {"0;3,6\n1;-4,25e1\n", Auto, {3.6, -42.5}},
+        {"0,5\t3,6\n1,5\t4\n", Auto, {3.6, 4}},
+        {"0,5  3,6\n1,5  4,25\n", Auto, {3.6, 4.25}},
+        {"0,5\t3,6\n1,5\t4\n", Comma, {3.6, 4}},
+        {"t;V, kN\n0;3,6\n", Auto, {3.6}},
+        {"0,3.6\n1,4\n", Auto, {3.6, 4}},  // points: the commas part
+        {"t,V\n0,3\n1,4\n", Auto, {3, 4}}, // two names: the commas part
+        {"0,3\n1,4\n", Point, {3, 4}},
+        {"0. 36\n1. 37\n", Point, {36, 37}},
+    };
+    for (const T_ROW& row : rows)
+        EXPECT_EQ(row.second, ColumnOf(row.text, 2, row.decimal)) << row.text;
+    EXPECT_EQ((T_V{3.6}), ColumnOf("3,6\n", 1, Comma));
+    EXPECT_EQ((T_V{8}), ColumnOf("a;Top disp;b\n1;8;2\n", 2));
+}
+
+TEST(RecorderFile, FindsAColumnByANameWithBlanks)
+{
+    for (const char* const text :
+         {"t;Top disp\n0;3,6\n", "t\tTop disp\n0\t3.6\n", "t, \"Top disp\"\n0, 3.6\n"}) {
+        CRecorderFile file;
+        T_FILE_ERROR error;
+        int column = 0;
+        ASSERT_EQ(1, file.Parse(text, "r.out", {}, error)) << error.text;
+        EXPECT_EQ(1, file.FindColumn("Top disp", column, error)) << error.text;
+        EXPECT_EQ(2, column);
+    }
+}
+
+TEST(RecorderFile, RefusesATableThatCanBeReadInTwoWays)
+{
+    const std::string either = " is two numbers, or one with a decimal comma: add \"decimal\": "
+                               "\"point\" (two) or \"decimal\": \"comma\" (one) to \"files\"";
+    struct T_ROW {
+        const char* text;
+        std::string message; // behind "r.out: line "
+    };
+    const T_ROW rows[] = {
+        {"3,6\n", "1, column 1: \"3,6\"" + either},
+        {"# V\n0,1,3,6\n", "2, column 1: \"0,1\"" + either},
+        {"V\n3,6\n", "2, column 1: \"3,6\"" + either},
+        {"1 2\n3, 4\n", "2, column 1: \"3,\": blanks and commas both stand between numbers"},
+        {"1 1,234.5\n2 999.5\n", "1, column 2: \"1,234.5\" has a comma in a table whose other "
+                                 "numbers have a decimal point"},
+        {"0.1;0.2\n0,1;0.2\n", "2, column 1: \"0,1\" has a comma in a table whose other numbers "
+                               "have a decimal point"},
+        {"0. 36 1\n", "1, column 1: \"0. 36\" is two numbers, or one with a blank in it: mend the "
+                      "file, or add \"decimal\": \"point\" (two) to \"files\""},
+        {"1 2\n\n3 4 5\n", "3, column 3: the row has 3 columns, the first one 2"},
+        {"1 2\r3\r", "2, column 2: the row has 1 columns, the first one 2"},
+    };
+    for (const T_ROW& row : rows) {
+        CRecorderFile file;
+        T_FILE_ERROR error;
+        EXPECT_EQ(0, file.Parse(row.text, "r.out", {}, error)) << row.text;
+        EXPECT_EQ("r.out: line " + row.message, error.text);
+        EXPECT_FALSE(file.IsLoaded());
+    }
+}
+
 TEST(RecorderFile, NamesFileLineAndColumnOfABadCell)
 {
     struct T_ROW {
         const char* text;
         int column;
         const char* message;
+        RECORDER_DECIMAL decimal = Auto;
     };
     const T_ROW rows[] = {
         {"1 2\n\n3 x\n4 y\n", 2, "r.out: line 3, column 2: \"x\" is not a finite number"},
@@ -48,14 +125,16 @@ TEST(RecorderFile, NamesFileLineAndColumnOfABadCell)
         {"nan nan\n", 1, "r.out: line 1, column 1: \"nan\" is not a finite number"}, // no header
         {"1 1e999\n", 2, "r.out: line 1, column 2: \"1e999\" is not a finite number"},
         {"1 1.0D+05\n", 2, "r.out: line 1, column 2: \"1.0D+05\" is not a finite number"},
-        {"1 2\n3\n", 2, "r.out: line 2, column 2: missing, the row has 1 columns"},
+        {"1;0. 36\n", 2, "r.out: line 1, column 2: \"0. 36\" is not a finite number"},
+        {"1;1.234\n", 2, "r.out: line 1, column 2: \"1.234\" is not a finite number", Comma},
+        {"1 2\n3 4\n", 3, "r.out: line 1, column 3: missing, the row has 2 columns"},
     };
     for (const T_ROW& row : rows) {
         CRecorderFile file;
-        file.Parse(row.text, "r.out", 0);
+        T_FILE_ERROR error;
+        ASSERT_EQ(1, file.Parse(row.text, "r.out", {0, row.decimal}, error)) << error.text;
         T_V values(file.RowCount(), 7.0);
         const T_V before = values;
-        T_FILE_ERROR error;
         EXPECT_EQ(0, file.AddColumn(row.column, values, error)) << row.text;
         EXPECT_EQ(row.message, error.text);
         EXPECT_EQ(before, values);
@@ -134,6 +213,10 @@ TEST_F(RecorderCase, RefusesBadTablesWithFileLineAndColumn)
     };
     const T_ROW rows[] = {
         {"\"skip_rows\": -1, " + head + kDisp, ".skip_rows: the number of rows can't be negative"},
+        {"\"decimal\": \",\", " + head + kDisp,
+         ".decimal: unknown decimal sign \",\"; allowed: point, comma"},
+        {"\"decimal\": \"comma\", " + head + kDisp,
+         ".base_reaction.columns[0]: sub/v.csv: line 2, column 2: missing, the row has 1 columns"},
         {"\"first_row\": \"zero\", " + head + kDisp,
          ".first_row: unknown first row \"zero\"; allowed: state before push"},
         {disp("{\"path\": \"d.out\", \"column\": 1, \"columns\": [1]}"),
