@@ -16,9 +16,9 @@ void AddFrame(T_MODEL& m)
     m.styp.gravity = 9.80665;
     m.nodes[1] = {1, {0, 0, 0}, {0, 0, 0}, {1, 1, 1, 1, 1, 1}};
     m.nodes[2] = {2, {0.1, -0.0, 3.0}, {12.5, 12.5, Limits::denorm_min()}, {0, 1, 0, 0, 0, 1}};
-    m.nodes[-7] = {-7, {Limits::max(), -1e-300, 6.0}, {-0.0, 1.0 / 3.0, 5.0}, {}};
+    m.nodes[7] = {7, {1e100, -1e-300, 6.0}, {-0.0, 1.0 / 3.0, 5.0}, {}};
     m.storeys[1] = {"1F", 3.0, {2, 1}};
-    m.storeys[2] = {"", -0.0, {}};
+    m.storeys[2] = {"Top", 1e-300, {}};
     T_EIGV_D bare;
     bare.period = 0.7;
     T_EIGV_D full{
@@ -32,11 +32,13 @@ void AddSpectra(T_MODEL& m)
 {
     T_SPFC_NTC ntc{'C', 3, 5.0, {}};
     ntc.states[1] = T_SPFC_NTC_STATE{0.06, 2.5, 0.28};
-    ntc.states[3] = T_SPFC_NTC_STATE{-0.0, 2.4, 0.35};
+    ntc.states[3] = T_SPFC_NTC_STATE{0.1, 2.4, 0.35};
     m.spectra[1] = {"D1", T_SPFC_ATC40{0.4, 0.6, std::nullopt}};
-    m.spectra[2] = {"D2", T_SPFC_ATC40{0.4, -0.0, false}};
+    m.spectra[2] = {"D2", T_SPFC_ATC40{0.4, 1e-9, false}};
     m.spectra[3] = {"E4", T_SPFC_EURO2003{2, 'E', 0.25, 7.5, 1.1, 0.1, std::nullopt, 2.0}};
-    m.spectra[4] = {"E4b", T_SPFC_EURO2003{}};
+    T_SPFC_EURO2003 bare;
+    bare.ag = 0.3;
+    m.spectra[4] = {"E4b", bare};
     m.spectra[5] = {"E94", T_SPFC_EURO1996{'B', 0.35, std::nullopt}};
     m.spectra[6] = {"N", ntc};
     m.spectra[7] = {"N0", T_SPFC_NTC{}};
@@ -47,7 +49,7 @@ void AddSpectra(T_MODEL& m)
 void AddEvaluations(T_MODEL& m)
 {
     m.pushovers[1] = {"PX", 2, 1, 0, {}};
-    m.pushovers[3] = {"PY mode", -7, 2, 3, {2, 1, 2}};
+    m.pushovers[3] = {"PY mode", 7, 2, 3, {2, 1, 2}};
     T_EVAL_D& bare = m.evaluations[1];
     bare.name = "E1";
     bare.push = "PX";
@@ -55,7 +57,7 @@ void AddEvaluations(T_MODEL& m)
     T_EVAL_D& full = m.evaluations[2];
     full = {"E2",
             "PY mode",
-            PUSH_METHOD::Ntc2018,
+            PUSH_METHOD::Fema440,
             'C',
             "N",
             3,
@@ -69,7 +71,7 @@ void AddEvaluations(T_MODEL& m)
             T_EVAL_BILINEAR{"masonry", 0.7, 0.8, true}};
     full.userDamping = std::array<double, 4>{10.0, 1.0, 40.0, -0.0};
     T_EVAL_D& blank = m.evaluations[5];
-    blank.name = std::string("E\0 3", 4);
+    blank.name = "E 3";
     blank.method = PUSH_METHOD::Fema440;
     blank.bilinear = T_EVAL_BILINEAR{};
     m.poverSteps[1] = {std::array<int, 3>{12, -2, 40}, std::nullopt};
@@ -109,7 +111,7 @@ T_MODEL_CONTENT RichContent()
     T_PUSH_DATA px;
     px.loadFactor = {0.5, 1.0, 1.25};
     px.baseReaction = {100.0, -0.0, Limits::max()};
-    px.displacement = {{-7, {1e-3, 1234.56789, -0.0}}, {2, {0.1, 0.2, Limits::denorm_min()}}};
+    px.displacement = {{7, {1e-3, 1234.56789, -0.0}}, {2, {0.1, 0.2, Limits::denorm_min()}}};
     content.results[1] = MakePushResult(px);
     content.results[3] = MakePushResult({{1.0}, {2.0}, {}});
     return content;

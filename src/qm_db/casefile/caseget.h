@@ -4,10 +4,10 @@
 #include "qm_db/casefile/jsonreader.h"
 #include "qm_db/records/casenames.h"
 #include "qm_db/records/hingefields.h"
+#include "qm_db/records/inputlimits.h"
 #include "qm_db/records/pushfields.h"
 #include "qm_db/records/stagefields.h"
 
-#include <cmath>
 #include <type_traits>
 
 class CCaseGet {
@@ -175,6 +175,11 @@ public:
     void CheckEach(const char* key, const R& values, F ok, const char* reason)
     {
         if (m_names && m_in.Has(key)) m_in.CheckEach(key, values, ok, reason);
+    }
+    void SameCount(const char* key, std::size_t count, std::size_t expected)
+    {
+        if (m_names && count != expected && m_in.Has(key))
+            m_in.FailAt(key, "IDS_QM_JSON_COUNT", std::to_string(count), std::to_string(expected));
     }
     /// A fault of the member, or of the whole object, in every file.
     void Rule(const char* key, bool ok, const char* reason)
@@ -345,7 +350,7 @@ private:
     void Read(CJsonReader& in, T& out, T_DIM dim) const
     {
         in.Read(out);
-        if (dim == kDimNone || in.Failed()) return;
+        if (in.Failed()) return;
         const double factor = SiFactor(m_units, dim);
         if constexpr (std::is_same_v<T, double>)
             Convert(in, out, factor);
@@ -356,7 +361,7 @@ private:
     static void Convert(CJsonReader& in, double& value, double factor)
     {
         value *= factor;
-        if (!std::isfinite(value)) in.Fail("IDS_QM_CASE_TOO_LARGE");
+        if (!IsUsableNumber(value)) in.Fail("IDS_QM_CASE_TOO_LARGE");
     }
 
     CJsonReader& m_in;

@@ -156,6 +156,10 @@ public:
     {
     }
     template <class... A>
+    void SameCount(const A&...) const
+    {
+    }
+    template <class... A>
     void Rule(const A&...) const
     {
     }

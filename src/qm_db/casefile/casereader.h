@@ -4,9 +4,8 @@
 
 #include "qm_db/casefile/jsonreader.h"
 #include "qm_db/modelstore.h"
+#include "qm_db/records/inputlimits.h"
 #include "qm_db/records/recordunits.h"
-
-#include <cmath>
 
 /// The whole document. `folder` is where relative paths of recorder files start.
 void ReadCase(CJsonReader& root, const std::string& folder, T_MODEL_CONTENT& content);
@@ -29,13 +28,13 @@ void ForEachRecord(CJsonReader& root, std::string_view key, F&& f)
     if (root.Has(key)) root.Member(key).ForEachItem(f);
 }
 
-/// The record to SI; a fault when a value leaves the range of a double.
+/// The record to SI; a fault when a value is too large then.
 template <class T>
 void RecordToSiChecked(CJsonReader& in, T& record, const T_UNITS& units)
 {
     RecordToSi(record, units);
     ForEachQuantity(record, [&](double& v, T_DIM) {
-        if (!std::isfinite(v)) in.Fail("IDS_QM_CASE_TOO_LARGE");
+        if (!IsUsableNumber(v)) in.Fail("IDS_QM_CASE_TOO_LARGE");
     });
 }
 

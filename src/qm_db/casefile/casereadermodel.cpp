@@ -4,30 +4,6 @@
 
 namespace {
 
-/// What a table asks of its records beside what their lists of members say.
-template <class R>
-void CheckRecord(CJsonReader&, const R&)
-{
-}
-void CheckRecord(CJsonReader& in, const T_ELEM_D& e)
-{
-    in.Check("id", e.id > 0, "IDS_QM_CASE_ELEMENT_ID");
-}
-void CheckRecord(CJsonReader& in, const T_POFC_D& f)
-{
-    if (f.step.size() != f.factor.size())
-        in.FailAt("factor", "IDS_QM_JSON_COUNT", std::to_string(f.factor.size()),
-                  std::to_string(f.step.size()));
-}
-
-void CheckRecord(CJsonReader& in, const T_SPFC_D& spectrum)
-{
-    const auto* const user = std::get_if<T_SPFC_USER>(&spectrum.data);
-    if (user && user->Sa.size() != user->T.size())
-        in.FailAt("Sa", "IDS_QM_JSON_COUNT", std::to_string(user->Sa.size()),
-                  std::to_string(user->T.size()));
-}
-
 /// Names and keys of a table that is read already.
 template <class R>
 void AddNames(const T_TABLE<R>& table, CCaseNames& names)
@@ -112,8 +88,7 @@ private:
     template <class R>
     void Read(const T_RECORD_ROW<R>& row)
     {
-        ReadTable(m_root, m_names, row, m_model, {},
-                  [](CJsonReader& in, int, const R& record) { CheckRecord(in, record); });
+        ReadTable(m_root, m_names, row, m_model, {}, [](CJsonReader&, int, const R&) {});
     }
     void Read(const T_RECORD_ROW<T_POLC_D>& row)
     {

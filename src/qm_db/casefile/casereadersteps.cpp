@@ -132,7 +132,7 @@ void ReadSeries(CJsonReader& in, ISeriesSource& source, std::optional<std::size_
         in.Fail("IDS_QM_JSON_COUNT", std::to_string(out.size()), std::to_string(*count));
     for (double& value : out) {
         value *= factor;
-        if (!std::isfinite(value)) return in.Fail("IDS_QM_CASE_TOO_LARGE");
+        if (!IsUsableNumber(value)) return in.Fail("IDS_QM_CASE_TOO_LARGE");
     }
 }
 

@@ -1,6 +1,7 @@
 #include "qm_db/casefile/jsonreader.h"
 
 #include "qm_base/textformat.h"
+#include "qm_db/records/inputlimits.h"
 
 #include <algorithm>
 #include <charconv>
@@ -21,12 +22,6 @@ constexpr std::array<const char*, 7> kKindNames{
 bool IsInt(double value)
 {
     return std::fabs(value) <= std::numeric_limits<int>::max() && value == std::floor(value);
-}
-
-bool HasControl(const std::string& text)
-{
-    return std::any_of(text.begin(), text.end(),
-                       [](char c) { return static_cast<unsigned char>(c) < 0x20 || c == 0x7f; });
 }
 
 std::string Joined(std::span<const char* const> names)
@@ -96,8 +91,7 @@ CJsonReader CJsonReader::Member(std::string_view key)
 void CJsonReader::GetName(std::string_view key, std::string& out, std::set<std::string>& taken)
 {
     Get(key, out);
-    Check(key, !out.empty(), "IDS_QM_JSON_NAME_EMPTY");
-    Check(key, !HasControl(out), "IDS_QM_JSON_NAME_CONTROL");
+    if (const char* const reason = NameFault(out)) Check(key, false, reason);
     if (!taken.insert(out).second) FailAt(key, "IDS_QM_JSON_TWICE", QuotedText(out));
 }
 
@@ -116,6 +110,7 @@ void CJsonReader::Read(double& out)
     if (Failed()) return;
     const auto* number = m_value ? std::get_if<double>(&m_value->data) : nullptr;
     if (!number) return FailType(kNumber);
+    if (!IsUsableNumber(*number)) return Fail("IDS_QM_CASE_TOO_LARGE");
     out = *number;
 }
 
@@ -149,6 +144,10 @@ void CJsonReader::Read(std::vector<double>& out)
     if (Failed()) return;
     auto* numbers = m_value ? std::get_if<T_JSON_NUMBERS>(&m_value->data) : nullptr;
     if (numbers) {
+        const auto bad = std::ranges::find_if_not(*numbers, IsUsableNumber);
+        if (bad != numbers->end())
+            return CJsonReader(nullptr, ItemPlace(m_place, bad - numbers->begin()), *m_error)
+                .Fail("IDS_QM_CASE_TOO_LARGE");
         out = std::move(*numbers);
         return;
     }

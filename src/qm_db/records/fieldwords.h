@@ -14,7 +14,8 @@
 // OptRef: another record, by name in a case file and by key in the model file. KeyRef, OptKeyRef:
 // by key in both. NameRef, NameRefs: by name in both. Node, Element, NodePair, NodeList, OptNodes,
 // OptElements: ids that must be there. StageStep: a step of a stage.
-// Check, CheckEach: a rule of the case file for a member. Rule: one of every file. What a rule says
+// Check, CheckEach: a rule of the case file for a member; SameCount: a list is as long as another.
+// They are asked of a whole model, too (modelfault.h). Rule: one of every file. What a rule says
 // when it is broken, and what a list offers, are keys of the message catalogue.
 #pragma once
 
@@ -243,6 +244,10 @@ public:
     }
     template <class... A>
     void CheckEach(const A&...) const
+    {
+    }
+    template <class... A>
+    void SameCount(const A&...) const
     {
     }
     template <class... A>

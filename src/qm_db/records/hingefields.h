@@ -329,4 +329,5 @@ void CaseFields(V& v, T_FIELD_REF<V, T_POFC_D> r)
 {
     v.Need("step", r.step);
     v.Need("factor", r.factor);
+    v.SameCount("factor", r.factor.size(), r.step.size());
 }

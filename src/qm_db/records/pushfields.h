@@ -152,11 +152,10 @@ void CaseFields(V& v, T_FIELD_REF<V, T_SPFC_USER> r)
     v.Need("T", r.T);
     v.Check("T", r.T.size() >= 2, "IDS_QM_CASE_SPECTRUM_POINTS");
     v.Need("Sa", r.Sa);
-    if (r.Sa.size() == r.T.size()) { // else the table of spectra says so
-        v.CheckEach("T", r.T, isNotNegative, "IDS_QM_CASE_PERIOD_NEGATIVE");
-        v.CheckEach("T", r.T, isAscending, "IDS_QM_CASE_PERIODS_ASCEND");
-        v.CheckEach("Sa", r.Sa, isNotNegative, "IDS_QM_CASE_SA_NEGATIVE");
-    }
+    v.SameCount("Sa", r.Sa.size(), r.T.size());
+    v.CheckEach("T", r.T, isNotNegative, "IDS_QM_CASE_PERIOD_NEGATIVE");
+    v.CheckEach("T", r.T, isAscending, "IDS_QM_CASE_PERIODS_ASCEND");
+    v.CheckEach("Sa", r.Sa, isNotNegative, "IDS_QM_CASE_SA_NEGATIVE");
     v.OptIf("gravity", r.gravity, kDimAccel);
     v.Check("gravity", r.gravity.value_or(1.0) > 0.0, "IDS_QM_CASE_GRAVITY");
 }
@@ -185,10 +184,10 @@ void CaseFields(V& v, T_FIELD_REF<V, T_EVAL_D> r)
     v.NameRef("push", r.push, KindOf<T_POLC_D>());
     v.template Enum<kFirstMethod>("method", r.method, kMethodNames, "IDS_QM_CHOICE_METHOD");
     const std::span<const char* const> offered = ProceduresOf(r.method);
-    v.Check("procedure", !offered.empty(), "IDS_QM_CASE_PROCEDURES");
     v.LetterIf("procedure", r.procedure,
                offered.empty() ? std::span<const char* const>(kProcedures) : offered,
                "IDS_QM_CHOICE_PROCEDURE");
+    v.Check("procedure", !offered.empty(), "IDS_QM_CASE_PROCEDURES");
     v.NameRef("spectrum", r.spectrum, KindOf<T_SPFC_D>());
     v.OptIf("behavior", r.behavior);
     v.OptIf("elastic_damping", r.elasticDamping);

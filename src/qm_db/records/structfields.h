@@ -193,6 +193,7 @@ template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_ELEM_D> r)
 {
     v.Need("id", r.id);
+    v.Check("id", r.id > 0, "IDS_QM_CASE_ELEMENT_ID");
     v.EnumOpt("kind", r.kind, ELEM_KIND::Beam, kElemKindNames, "IDS_QM_CHOICE_KIND");
     const bool spring = r.kind == ELEM_KIND::Spring;
     v.NodePair("nodes", r.nodeI, r.nodeJ, spring ? 1 : 2,

@@ -4,6 +4,7 @@
 #include "qm_db/file/checksum.h"
 #include "qm_db/file/filehandle.h"
 #include "qm_db/file/storefault.h"
+#include "qm_db/records/modelfault.h"
 #include "qm_db/store/recordcodec.h"
 #include "qm_db/store/resultblocks.h"
 #include "qm_db/store/resultblocksource.h"
@@ -77,6 +78,10 @@ T_HEADER CheckHeader(const std::string& path, const T_SCHEMA& schema)
         throw CStoreFault(FILE_FAULT::BadInput, "IDS_QM_DB_FILE_NEWER", std::to_string(version),
                           std::to_string(schema.version));
     }
+    if (!CanMigrate(version, schema)) {
+        throw CStoreFault(FILE_FAULT::BadInput, "IDS_QM_DB_FILE_TOO_OLD", std::to_string(version),
+                          std::to_string(schema.version));
+    }
     const std::uint32_t pageSize = BigEndian(header, 16, 2) == 1 ? 65536 : BigEndian(header, 16, 2);
     const std::int64_t expected = std::int64_t{pageSize} * BigEndian(header, 28, 4);
     if (size < expected) ThrowTruncated(size, expected);
@@ -138,16 +143,32 @@ void CompareSum(const T_TABLE_SUMS& stored, const std::string& table, std::uint6
         ThrowDamaged(MMSGFunction::Format("IDS_QM_DB_DAMAGE_TABLE", {table}));
 }
 
-/// An older file is checked by the list of its own tables before anything is changed.
+/// An older file is checked by the list of its own tables, which CheckSchema() knows, before
+/// anything is changed.
 CSqliteDb MigratedCopy(const CSqliteDb& db, int version, const T_SCHEMA& schema)
 {
     const T_TABLE_SUMS stored = ReadChecksums(db);
     CompareSum(stored, kSchemaTable, SumOfTable(db, kSchemaTable));
-    for (const auto& [table, sum] : stored)
-        CompareSum(stored, table, SumOfTable(db, table));
+    CSqliteStmt tables(db, "SELECT name FROM sqlite_schema ORDER BY rowid");
+    while (tables.Step()) {
+        const std::string table(tables.Text(0));
+        if (table != kSumTable) CompareSum(stored, table, SumOfTable(db, table));
+    }
     CSqliteDb copy = CSqliteDb::MemoryCopyOf(db);
     Migrate(copy, version, schema);
     return copy;
+}
+
+/// Heads can't speak of more numbers than the file has bytes for.
+void CheckSizes(std::int64_t fileSize, const std::vector<T_RESULT_HEAD>& heads,
+                const std::vector<T_STATIC_HEAD>& staticHeads)
+{
+    double bytes = 0.0;
+    for (const T_RESULT_HEAD& head : heads)
+        bytes += BytesOf(head);
+    for (const T_STATIC_HEAD& head : staticHeads)
+        bytes += BytesOf(head);
+    if (bytes > static_cast<double>(fileSize)) ThrowDamaged(kBlockTable);
 }
 
 } // namespace
@@ -158,12 +179,10 @@ T_MODEL_CONTENT ReadModelFile(const std::string& path, const T_SCHEMA& schema, C
     const bool older = header.version < schema.version;
     const bool whole = depth == CHECK_DEPTH::Whole || older || header.fileSize <= kCheckAllUpTo;
 
-    auto db = std::make_shared<const CSqliteDb>(CSqliteDb::OpenReadOnly(path));
+    auto db = std::make_shared<const CSqliteDb>(CSqliteDb::OpenReadOnly(path, header.fileSize));
+    CheckSchema(*db, header.version); // before any statement that a foreign schema could extend
     CheckIntegrity(*db, whole);
-    if (older)
-        db = std::make_shared<const CSqliteDb>(MigratedCopy(*db, header.version, schema));
-    else
-        CheckSchema(*db);
+    if (older) db = std::make_shared<const CSqliteDb>(MigratedCopy(*db, header.version, schema));
 
     T_MODEL_CONTENT content;
     T_TABLE_SUMS found;
@@ -178,11 +197,13 @@ T_MODEL_CONTENT ReadModelFile(const std::string& path, const T_SCHEMA& schema, C
         for (const auto& [table, sum] : found)
             CompareSum(stored, table, sum);
     }
+    if (const std::string fault = ModelFault(content.model); !fault.empty()) ThrowDamaged(fault);
+    std::vector<T_STATIC_HEAD> all = staticHeads;
+    for (const T_STAGED_HEAD& staged : stagedHeads)
+        all.push_back(staged.head);
+    CheckSizes(header.fileSize, heads, all);
     if (whole) {
         CheckBlocks(*db, heads);
-        std::vector<T_STATIC_HEAD> all = staticHeads;
-        for (const T_STAGED_HEAD& staged : stagedHeads)
-            all.push_back(staged.head);
         CheckStaticBlocks(*db, all);
     }
     for (const T_RESULT_HEAD& head : heads)
@@ -218,6 +239,9 @@ void WriteChecksums(const CSqliteDb& db)
 
 void WriteModelFile(const std::string& path, const T_MODEL_CONTENT& content)
 {
+    // What would not open again is not written.
+    if (std::string fault = ModelFault(content.model); !fault.empty())
+        throw CStoreFault(FILE_FAULT::BadInput, "IDS_QM_DB_FILE_BAD_RECORD", std::move(fault));
     const CSqliteDb db = CSqliteDb::OpenForWriting(path);
     CSqliteTransaction transaction(db);
     CreateSchema(db);

@@ -118,6 +118,25 @@ constexpr const char* kTables[] = {
 
     kMaterials, kSections, kHingeTypes, kInelasticHinges, kIncrementFunctions};
 
+constexpr std::size_t kHingeTables = 5; // at the end of kTables; they came with version 2
+
+/// Columns that a later version added to a table of kTables.
+struct T_ADDED_COLUMN {
+    int since;
+    const char* table; // how its statement begins
+    const char* column;
+};
+constexpr T_ADDED_COLUMN kAddedColumns[] = {
+    {2, "CREATE TABLE model(", "concrete_code TEXT"},
+    {2, "CREATE TABLE model(", "steel_code TEXT"},
+    {2, "CREATE TABLE model(", "alternative_hysteresis INTEGER NOT NULL"},
+    {2, "CREATE TABLE model(", "wall_strength_degradation INTEGER NOT NULL"},
+    {2, "CREATE TABLE model(", "gsd INTEGER NOT NULL"},
+    {2, "CREATE TABLE pushovers(", "body TEXT"},
+    {3, "CREATE TABLE model(", "plane INTEGER"},
+    {4, "CREATE TABLE model(", "body TEXT"},
+};
+
 constexpr T_MEMBER_PLACE kMemberPlaces[] = {
     {"model", "force", MEMBER_PLACE::Column, "force_unit"},
     {"model", "length", MEMBER_PLACE::Column, "length_unit"},
@@ -192,11 +211,21 @@ void MigrateFrom3(const CSqliteDb& db)
         db.Exec(sql);
 }
 
-std::vector<std::string> AllTables()
+/// Tables of a version, in the order in which it makes them.
+std::vector<std::string> TablesOf(int version)
 {
     std::vector<std::string> all(std::begin(kTables), std::end(kTables));
-    all.insert(all.end(), std::begin(kVersion3), std::end(kVersion3));
-    all.insert(all.end(), std::begin(kVersion4), std::end(kVersion4));
+    if (version == 1) all.resize(all.size() - kHingeTables);
+    if (version >= 3) all.insert(all.end(), std::begin(kVersion3), std::end(kVersion3));
+    if (version >= 4) all.insert(all.end(), std::begin(kVersion4), std::end(kVersion4));
+    for (const T_ADDED_COLUMN& added : kAddedColumns) {
+        if (version >= added.since) continue;
+        const std::string text = std::string(", ") + added.column;
+        for (std::string& sql : all) {
+            const auto at = sql.starts_with(added.table) ? sql.find(text) : sql.npos;
+            if (at != sql.npos) sql.erase(at, text.size());
+        }
+    }
     return all;
 }
 
@@ -217,16 +246,16 @@ const T_SCHEMA& CurrentSchema()
 
 void CreateSchema(const CSqliteDb& db)
 {
-    for (const std::string& sql : AllTables())
+    for (const std::string& sql : TablesOf(CurrentSchema().version))
         db.Exec(sql);
     db.Exec("PRAGMA application_id = " + std::to_string(kModelApplicationId));
     db.Exec("PRAGMA user_version = " + std::to_string(CurrentSchema().version));
 }
 
-void CheckSchema(const CSqliteDb& db)
+void CheckSchema(const CSqliteDb& db, int version)
 {
     CSqliteStmt stmt(db, "SELECT type, sql FROM sqlite_schema ORDER BY rowid");
-    const std::vector<std::string> tables = AllTables();
+    const std::vector<std::string> tables = TablesOf(version);
     std::size_t count = 0;
     bool same = true;
     while (same && stmt.Step()) {
@@ -237,15 +266,17 @@ void CheckSchema(const CSqliteDb& db)
         ThrowDamaged(zql::lib::MMSGFunction::GetValue("IDS_QM_DB_DAMAGE_SCHEMA"));
 }
 
+bool CanMigrate(int from, const T_SCHEMA& schema)
+{
+    for (int version = from; version < schema.version; ++version)
+        if (std::ranges::find(schema.migrations, version, &T_MIGRATION::from) ==
+            schema.migrations.end())
+            return false;
+    return true;
+}
+
 void Migrate(const CSqliteDb& db, int from, const T_SCHEMA& schema)
 {
-    for (int version = from; version < schema.version; ++version) {
-        const auto step = std::find_if(schema.migrations.begin(), schema.migrations.end(),
-                                       [&](const T_MIGRATION& m) { return m.from == version; });
-        if (step == schema.migrations.end()) {
-            throw CStoreFault(FILE_FAULT::BadInput, "IDS_QM_DB_FILE_TOO_OLD", std::to_string(from),
-                              std::to_string(schema.version));
-        }
-        step->up(db);
-    }
+    for (int version = from; version < schema.version; ++version)
+        std::ranges::find(schema.migrations, version, &T_MIGRATION::from)->up(db);
 }

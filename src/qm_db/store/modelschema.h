@@ -71,8 +71,11 @@ const T_SCHEMA& CurrentSchema();
 /// Makes the tables of the current version and sets application id and version.
 void CreateSchema(const CSqliteDb& db);
 
-/// Throws "damaged" unless the schema is, statement by statement, the current one.
-void CheckSchema(const CSqliteDb& db);
+/// Throws "damaged" unless the schema is, statement by statement, that of the version: no view, no
+/// trigger, no index, no column that would run an expression of the file's when it is read.
+void CheckSchema(const CSqliteDb& db, int version);
 
-/// Walks the database up to the schema's version; throws when a step is missing.
+/// Whether there is a step up from that version and from each one after it.
+bool CanMigrate(int from, const T_SCHEMA& schema);
+/// Walks the database up to the schema's version; CanMigrate() has been asked.
 void Migrate(const CSqliteDb& db, int from, const T_SCHEMA& schema);

@@ -1,10 +1,24 @@
 #include "qm_db/store/packednumbers.h"
 
+#include <cmath>
+#include <cstring>
+
 namespace {
 
 constexpr std::size_t kDirs = std::tuple_size_v<T_DIRS6>;
 
 } // namespace
+
+bool AllFinite(std::span<const std::byte> packed)
+{
+    bool finite = true;
+    for (std::size_t at = 0; at < packed.size(); at += sizeof(double)) {
+        double value = 0.0;
+        std::memcpy(&value, packed.data() + at, sizeof value);
+        finite = finite && std::isfinite(value);
+    }
+    return finite;
+}
 
 void CNumberWriter::Put(std::vector<int>& to, const T_END_RELEASES& release)
 {

@@ -4,9 +4,14 @@
 #include "qm_db/records.h"
 
 #include <concepts>
+#include <cstddef>
+#include <span>
 #include <vector>
 
 using T_END_RELEASES = T_ENDS<T_DIRS6>; // one bit per released direction, the I-end's first
+
+/// False where one of the packed doubles is not finite.
+bool AllFinite(std::span<const std::byte> packed);
 
 /// Kind of number and how many.
 template <class T>

@@ -58,6 +58,7 @@ void ReadTexts(const T_RECORD_ROW<R>& kind, const CPackedArrays& arrays, T_MODEL
     T_TABLE<R>& table = model.*kind.table;
     for (const std::int64_t key : arrays.Keys(TextOwner(kind.store))) {
         const CRecordRow row(kind.store, key);
+        if (key != static_cast<int>(key)) row.ThrowBadCell("key");
         const bool isNew = table.try_emplace(static_cast<int>(key)).second;
         if (isNew == kIsPacked<R>) row.ThrowBadCell("key");
         CRowGet get(row, arrays, places);

@@ -2,10 +2,10 @@
 
 #include "qm_db/file/checksum.h"
 #include "qm_db/file/storefault.h"
+#include "qm_db/store/packednumbers.h"
 #include "qm_db/store/sqlitedb.h"
 #include "qm_db/store/sqlitestmt.h"
 
-#include <cmath>
 #include <cstring>
 #include <limits>
 
@@ -26,17 +26,6 @@ std::vector<T> Unpack(std::span<const std::byte> bytes)
     std::vector<T> values(bytes.size() / sizeof(T));
     if (!values.empty()) std::memcpy(values.data(), bytes.data(), bytes.size());
     return values;
-}
-
-bool AllFinite(std::span<const std::byte> packed)
-{
-    bool finite = true;
-    for (std::size_t at = 0; at < packed.size(); at += sizeof(double)) {
-        double value = 0.0;
-        std::memcpy(&value, packed.data() + at, sizeof value);
-        finite = finite && std::isfinite(value);
-    }
-    return finite;
 }
 
 std::string Place(const std::string& owner, std::int64_t key, const std::string& name)

@@ -7,6 +7,8 @@
 #include "qm_db/store/recordcodecrow.h"
 #include "qm_db/store/recordwords.h"
 
+#include <cmath>
+
 class CRowPut : public CRowWords<CRowPut> {
 public:
     template <class T>
@@ -178,7 +180,11 @@ private:
     void Get(const std::string& column, int& value) const;
     void Get(const std::string& column, bool& value) const;
     void Get(const std::string& column, char& value) const;
-    void Get(const std::string& column, double& value) const { value = Take<double>(column); }
+    void Get(const std::string& column, double& value) const
+    {
+        value = Take<double>(column);
+        if (!std::isfinite(value)) m_row.ThrowBadCell(column);
+    }
     void Get(const std::string& column, std::string& value) const
     {
         value = Take<std::string>(column);

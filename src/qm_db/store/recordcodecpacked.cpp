@@ -120,6 +120,7 @@ public:
             if (!m_isRight) ThrowDamaged(place);
             if (m_count == kUnknown) return; // no list at all
             if constexpr (requires { record.id; }) record.id = key;
+            if (!table.empty() && key <= table.rbegin()->first) ThrowDamaged(place);
             table.emplace_hint(table.end(), key, std::move(record));
         }
     }

@@ -225,13 +225,17 @@ public:
         Group(key, members);
     }
 
-    // The model file holds what the model holds: the rules of a case file are not asked.
+    // The rules of a case file are asked of the whole model (modelfault.h).
     template <class... A>
     void Check(const A&...) const
     {
     }
     template <class... A>
     void CheckEach(const A&...) const
+    {
+    }
+    template <class... A>
+    void SameCount(const A&...) const
     {
     }
     void Rule(const char* key, bool ok, const char* reason) { Me().Body().Rule(key, ok, reason); }

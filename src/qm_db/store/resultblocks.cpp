@@ -4,6 +4,7 @@
 #include "qm_db/file/checksum.h"
 #include "qm_db/file/storefault.h"
 #include "qm_db/store/modelschema.h"
+#include "qm_db/store/packednumbers.h"
 #include "qm_db/store/recordcodecrow.h"
 #include "qm_db/store/sqlitedb.h"
 #include "qm_db/store/sqlitestmt.h"
@@ -209,7 +210,7 @@ std::span<const std::byte> CheckedBlock(const CSqliteStmt& row, const T_BLOCK_KE
     const std::span<const std::byte> bytes = row.Blob(8);
     if (row.Text(6) != "little" ||
         bytes.size() != static_cast<std::size_t>(count) * static_cast<std::size_t>(width) ||
-        row.Int(7) != SumOf(key, count, bytes))
+        row.Int(7) != SumOf(key, count, bytes) || (width == 8 && !AllFinite(bytes)))
         ThrowBadBlock(key);
     return bytes;
 }
@@ -232,6 +233,12 @@ std::vector<T_RESULT_HEAD> ReadResultHeads(const CSqliteDb& db, T_TABLE_SUMS& su
     }
     sums["results"] = sum.Value();
     return heads;
+}
+
+double BytesOf(const T_RESULT_HEAD& head)
+{
+    const double steps = head.steps, nodes = head.nodes;
+    return 8.0 * steps * (2.0 + nodes) + 4.0 * nodes;
 }
 
 void CheckBlocks(const CSqliteDb& db, const std::vector<T_RESULT_HEAD>& heads)

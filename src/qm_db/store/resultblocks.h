@@ -53,7 +53,8 @@ inline constexpr const char* kBlockColumns =
     "pushover, part, chunk, step, count, width, byte_order, checksum, data";
 
 /// Packed numbers of the row, after checking that it is the block of that key with that many
-/// numbers and the right checksum; throws "damaged", naming the block. The view is the row's.
+/// numbers, the right checksum, and numbers that are finite; throws "damaged", naming the block.
+/// The view is the row's.
 std::span<const std::byte> CheckedBlock(const CSqliteStmt& row, const T_BLOCK_KEY& key, int count);
 /// "Damaged", naming the block: what a missing row is.
 [[noreturn]] void ThrowBadBlock(const T_BLOCK_KEY& key);
@@ -104,6 +105,9 @@ void WriteResults(const CSqliteDb& db, const T_RESULT_MAP& results);
 
 /// Rows of "results"; their sum goes to `sums`.
 std::vector<T_RESULT_HEAD> ReadResultHeads(const CSqliteDb& db, T_TABLE_SUMS& sums);
+
+/// Bytes of the numbers that a head speaks of.
+double BytesOf(const T_RESULT_HEAD& head);
 
 /// Reads and checks every block of these results, and that there are no others of these parts.
 void CheckBlocks(const CSqliteDb& db, const std::vector<T_RESULT_HEAD>& heads);

@@ -38,6 +38,8 @@ const std::vector<int>& CBlockPushResult::Nodes() const
     for (int chunk = 0; chunk < ChunkCount(m_head.nodes); ++chunk) {
         CBlockRun run(*m_db, {m_head.pushover, BLOCK_PART::NodeIds, chunk});
         run.Next(ChunkSize(m_head.nodes, chunk), nodes);
+        if (std::ranges::adjacent_find(nodes, std::ranges::greater_equal()) != nodes.end())
+            ThrowBadBlock({m_head.pushover, BLOCK_PART::NodeIds, chunk});
     }
     return m_nodes.emplace(std::move(nodes));
 }

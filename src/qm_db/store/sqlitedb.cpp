@@ -3,6 +3,7 @@
 #include "qm_db/file/storefault.h"
 #include "qm_db/store/sqlitestmt.h"
 
+#include <algorithm>
 #include <cerrno>
 #include <cstring>
 #include <filesystem>
@@ -28,6 +29,24 @@ std::string UriOf(const std::string& path, const char* options)
     }
     return uri + options;
 }
+
+constexpr int kStepsPerCall = 1000;            // of SQLite's machine, between two calls
+constexpr std::int64_t kLeastCalls = 1000;     // a million steps for any file
+constexpr std::int64_t kBytesPerCall = 100;    // ten steps for each byte of the file
+constexpr std::int64_t kLeastLength = 1 << 20; // bytes of a value or row, whatever the file's size
+constexpr std::int64_t kMostLength = 1000000000;
+
+struct T_LIMIT {
+    int id, value;
+};
+// What our own statements need, with room to spare.
+constexpr T_LIMIT kLimits[] = {
+    {SQLITE_LIMIT_SQL_LENGTH, 100000},   {SQLITE_LIMIT_COLUMN, 100},
+    {SQLITE_LIMIT_EXPR_DEPTH, 100},      {SQLITE_LIMIT_COMPOUND_SELECT, 10},
+    {SQLITE_LIMIT_VDBE_OP, 100000},      {SQLITE_LIMIT_FUNCTION_ARG, 16},
+    {SQLITE_LIMIT_ATTACHED, 0},          {SQLITE_LIMIT_LIKE_PATTERN_LENGTH, 100},
+    {SQLITE_LIMIT_VARIABLE_NUMBER, 100}, {SQLITE_LIMIT_TRIGGER_DEPTH, 1},
+    {SQLITE_LIMIT_WORKER_THREADS, 0}};
 
 /// Error number behind an input or output error, or 0. SQLite does not always keep it; of the
 /// process's own number only what can come from such an error is believed.
@@ -58,8 +77,33 @@ CSqliteDb::CSqliteDb(const std::string& uri, int flags, bool writes) : m_writes(
 }
 
 CSqliteDb::CSqliteDb(CSqliteDb&& other) noexcept
-    : m_db(std::exchange(other.m_db, nullptr)), m_writes(other.m_writes)
+    : m_db(std::exchange(other.m_db, nullptr)), m_writes(other.m_writes), m_bytes(other.m_bytes),
+      m_work(std::move(other.m_work))
 {
+}
+
+int CSqliteDb::CountWork(void* work)
+{
+    auto& count = *static_cast<T_WORK*>(work);
+    return ++count.calls > count.most ? 1 : 0;
+}
+
+void CSqliteDb::StartStep() const
+{
+    if (m_work) m_work->calls = 0;
+}
+
+void CSqliteDb::Distrust(std::int64_t bytes)
+{
+    for (const T_LIMIT& limit : kLimits)
+        sqlite3_limit(m_db, limit.id, limit.value);
+    sqlite3_limit(m_db, SQLITE_LIMIT_LENGTH,
+                  static_cast<int>(std::clamp(bytes, kLeastLength, kMostLength)));
+    m_bytes = bytes;
+    m_work = std::make_unique<T_WORK>(T_WORK{0, kLeastCalls + bytes / kBytesPerCall});
+    sqlite3_progress_handler(m_db, kStepsPerCall, CountWork, m_work.get());
+    // Nothing goes to a temporary file, and no function of a schema's runs.
+    Exec("PRAGMA temp_store = MEMORY; PRAGMA trusted_schema = OFF; PRAGMA mmap_size = 0");
 }
 
 CSqliteDb::~CSqliteDb()
@@ -67,9 +111,10 @@ CSqliteDb::~CSqliteDb()
     sqlite3_close_v2(m_db);
 }
 
-CSqliteDb CSqliteDb::OpenReadOnly(const std::string& path)
+CSqliteDb CSqliteDb::OpenReadOnly(const std::string& path, std::int64_t bytes)
 {
     CSqliteDb db(UriOf(path, "?mode=ro&immutable=1"), SQLITE_OPEN_READONLY, false);
+    db.Distrust(bytes);
     // Everything is read once and in order: a large page cache would only cost memory.
     db.Exec("PRAGMA cell_size_check = ON; PRAGMA cache_size = 64");
     return db;
@@ -92,11 +137,13 @@ CSqliteDb CSqliteDb::MemoryCopyOf(const CSqliteDb& source)
     sqlite3_backup_step(backup, -1);
     const int code = sqlite3_backup_finish(backup);
     if (code != SQLITE_OK) copy.ThrowLast(code);
+    copy.Distrust(source.m_bytes);
     return copy;
 }
 
 void CSqliteDb::Exec(const std::string& sql) const
 {
+    StartStep();
     const int code = sqlite3_exec(m_db, sql.c_str(), nullptr, nullptr, nullptr);
     if (code != SQLITE_OK) ThrowLast(code);
 }

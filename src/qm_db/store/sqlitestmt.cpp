@@ -65,6 +65,7 @@ void CSqliteStmt::BindNull(int at)
 
 bool CSqliteStmt::Step()
 {
+    m_db.StartStep();
     const int code = sqlite3_step(m_stmt);
     if (code != SQLITE_ROW && code != SQLITE_DONE) m_db.ThrowLast(code);
     return code == SQLITE_ROW;

@@ -152,6 +152,14 @@ std::vector<T_STATIC_HEAD> ReadStaticHeads(const CSqliteDb& db, T_TABLE_SUMS& su
     return heads;
 }
 
+double BytesOf(const T_STATIC_HEAD& head)
+{
+    double bytes = 0.0;
+    for (const T_STATIC_PART& part : kParts)
+        bytes += 1.0 * CountOf(head, part) * part.width * (part.width == 1 ? 4 : 8);
+    return bytes;
+}
+
 void CheckStaticBlocks(const CSqliteDb& db, const std::vector<T_STATIC_HEAD>& heads)
 {
     std::vector<std::pair<T_BLOCK_KEY, int>> expected; // with the count of numbers
@@ -206,6 +214,7 @@ const std::vector<int>& CBlockStaticResult::Ids(BLOCK_PART part, int chunk)
     std::vector<int> ids;
     CBlockRun(*m_db, KeyOf(m_head, part, chunk))
         .Next(ChunkSize(CountOf(m_head, PartOf(part)), chunk), ids);
+    if (!Ascends(ids)) ThrowBadBlock(KeyOf(m_head, part, chunk));
     return known.emplace(chunk, std::move(ids)).first->second;
 }
 

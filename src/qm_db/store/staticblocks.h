@@ -34,6 +34,9 @@ void WriteStaticResults(const CSqliteDb& db, const T_MODEL& model, const T_STATI
 /// Rows of "static_results"; their sum goes to `sums`.
 std::vector<T_STATIC_HEAD> ReadStaticHeads(const CSqliteDb& db, T_TABLE_SUMS& sums);
 
+/// Bytes of the numbers that a head speaks of.
+double BytesOf(const T_STATIC_HEAD& head);
+
 /// Reads and checks every block of these results, static and of stages, and that there are no
 /// others of these parts.
 void CheckStaticBlocks(const CSqliteDb& db, const std::vector<T_STATIC_HEAD>& heads);

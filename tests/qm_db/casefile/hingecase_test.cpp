@@ -152,6 +152,7 @@ TEST(HingeCase, FilesOfOlderVersionsOpenAndAreSavedAsTheCurrentVersion)
         T_MODEL& m = content.model; // takes what its version could not hold
         m.hingeTypes = rich.hingeTypes;
         m.materials = rich.materials;
+        m.pushovers[1].name = "PX";
         m.pushovers[1].control = T_POLC_CONTROL{};
         m.styp.gsd = m.styp.stageControl.cableSag = true;
         m.styp.plane = MODEL_PLANE::XZ;

@@ -2,12 +2,14 @@
 #include "qm_base/msgfunction.h"
 #include "qm_db/modelstore.h"
 #include "qm_db/store/modelreader.h"
+#include "qm_db/store/resultblocks.h"
 #include "qm_db/store/sqlitedb.h"
 
 #include <cstring>
 #include <fcntl.h>
 #include <filesystem>
 #include <gtest/gtest.h>
+#include <limits>
 #include <unistd.h>
 
 namespace fs = std::filesystem;
@@ -139,6 +141,13 @@ TEST_F(ModelStoreDamage, OtherTablesUnderOurMarkAreRefused)
         {"a text that is no JSON", "UPDATE model SET body = '{'", true},
         {"a version without a way up", "PRAGMA user_version = 0", true},
         {"an old version with new columns", "PRAGMA user_version = 1", true},
+        {"a node key twice",
+         "UPDATE arrays SET data = x'010000000100000007000000' "
+         "WHERE owner = 'nodes' AND name = 'id'",
+         true},
+        {"more steps than bytes", "UPDATE results SET steps = 1000000000 WHERE key = 1", true},
+        {"more nodes than bytes",
+         "INSERT INTO static_results VALUES(1, 2000000000, 2000000000, 0, 0)", true},
     };
     for (const auto& c : cases) {
         WriteBytes(m_path, m_bytes);
@@ -147,6 +156,102 @@ TEST_F(ModelStoreDamage, OtherTablesUnderOurMarkAreRefused)
         if (c.sumsToo) WriteChecksums(CSqliteDb::OpenForWriting(m_path));
         ExpectRefused(c.label);
     }
+}
+
+/// Right checksums do not make a value right: what a case file refuses is refused here, by name.
+TEST_F(ModelStoreDamage, ValuesThatBreakTheRulesOfTheirRecordAreRefused)
+{
+    const struct {
+        const char* sql;
+        const char* place; // and the reason, where there is room for two
+    } cases[] = {
+        {"UPDATE pushovers SET direction = 7 WHERE key = 1", "pushovers 1 direction"},
+        {"UPDATE pushovers SET direction = 0 WHERE key = 1", "pushovers 1 direction"},
+        {"UPDATE pushovers SET direction = -2 WHERE key = 1", "pushovers 1 direction"},
+        {"UPDATE pushovers SET direction = 1000000 WHERE key = 1", "pushovers 1 direction"},
+        {"UPDATE pushovers SET pattern_kind = 9 WHERE key = 1", "pushovers 1 pattern_kind"},
+        {"DELETE FROM arrays WHERE owner = 'spectra' AND key = 9",
+         "spectra 9 T: a spectrum needs at least 2 points"},
+        {"DELETE FROM arrays WHERE owner = 'spectra' AND key = 9 AND name = 'Sa'",
+         "spectra 9 Sa: 0 values, expected 3"},
+        {"UPDATE spectra SET soil = 'Q' WHERE key = 3", "spectra 3 soil: unknown soil \"Q\""},
+        {"UPDATE spectra SET Ca = 0 WHERE key = 1", "spectra 1 Ca: "},
+        {"UPDATE spectra SET Ca = 9e999 WHERE key = 1", "spectra 1 Ca"},
+        {"UPDATE spectra SET Ca = 1.1e100 WHERE key = 1", "spectra 1 Ca: a value is too large"},
+        {"UPDATE spectra SET name = 'D1' WHERE key = 2", "spectra 2 name: \"D1\" appears twice"},
+        {"UPDATE evaluations SET procedure = 'Z' WHERE key = 2", "evaluations 2 procedure: "},
+        {"UPDATE evaluations SET bilinear_rule = 'x' WHERE key = 2",
+         "evaluations 2 bilinear.rule: "},
+        {"UPDATE evaluations SET plot_type = 99 WHERE key = 2", "evaluations 2 plotType: "},
+        {"UPDATE storeys SET height = 0 WHERE key = 1", "storeys 1 height: "},
+        {"UPDATE storeys SET name = '' WHERE key = 1", "storeys 1 name: a name can't be empty"},
+        {"UPDATE modes SET period = -1 WHERE key = 1", "modes 1 period: "},
+        {"UPDATE arrays SET data = x'FDFFFFFF0200000007000000' "
+         "WHERE owner = 'nodes' AND name = 'id'",
+         "nodes -3 id: "},
+    };
+    for (const auto& c : cases) {
+        WriteBytes(m_path, m_bytes);
+        CSqliteDb::OpenForWriting(m_path).Exec(c.sql);
+        WriteChecksums(CSqliteDb::OpenForWriting(m_path));
+        ExpectRefused(c.sql);
+        EXPECT_NE(std::string::npos, m_error.text.find(c.place)) << m_error.text;
+    }
+}
+
+TEST_F(ModelStoreDamage, ARecordThatWouldNotOpenAgainIsNotSaved)
+{
+    T_MODEL_CONTENT content = RichContent();
+    content.model.storeys[1].height = -1.0;
+    EXPECT_EQ(0, CModelStore().Save(m_path, content, m_error));
+    EXPECT_NE(std::string::npos, m_error.text.find("not saved: storeys 1 height: "))
+        << m_error.text;
+    EXPECT_EQ(m_bytes, BytesOf(m_path));
+}
+
+TEST_F(ModelStoreDamage, BlocksOfNumbersThatAreNotFiniteAreRefused)
+{
+    constexpr double kInf = std::numeric_limits<double>::infinity();
+    for (const double bad : {kInf, -kInf, std::numeric_limits<double>::quiet_NaN()}) {
+        WriteBytes(m_path, m_bytes);
+        const CSqliteDb db = CSqliteDb::OpenForWriting(m_path);
+        db.Exec("DELETE FROM result_blocks WHERE pushover = 1 AND part = 1");
+        const double values[] = {100.0, bad, 1.0};
+        CBlockWriter(db).Write({1, BLOCK_PART::BaseReaction}, std::span<const double>(values));
+        WriteChecksums(db);
+        ExpectRefused("a block with " + std::to_string(bad));
+    }
+}
+
+/// What SQLite would run while our own statements read the table "modes".
+TEST_F(ModelStoreDamage, ASchemaThatRunsExpressionsIsRefusedInEveryVersion)
+{
+    constexpr const char* kEndless =
+        "CREATE VIEW modes(key, period, negative_zeros) AS WITH RECURSIVE "
+        "n(i) AS (SELECT 1 UNION ALL SELECT i + 1 FROM n) SELECT i, 1.0, 0 FROM n";
+    const std::string files[] = {m_path, QM_TEST_DATA "/model-v1.qmdb",
+                                 QM_TEST_DATA "/model-v2.qmdb", QM_TEST_DATA "/model-v3.qmdb"};
+    for (const std::string& file : files) {
+        WriteBytes(m_path, file == m_path ? m_bytes : BytesOf(file));
+        ASSERT_EQ(1, Open()) << m_error.text;
+        const CSqliteDb db = CSqliteDb::OpenForWriting(m_path);
+        db.Exec("DROP TABLE modes");
+        db.Exec(kEndless);
+        ExpectRefused(file);
+        EXPECT_EQ(
+            Message("IDS_QM_DB_FILE_DAMAGED", MMSGFunction::GetValue("IDS_QM_DB_DAMAGE_SCHEMA")),
+            m_error.text);
+    }
+}
+
+/// A name in "checksums" is not part of a statement.
+TEST_F(ModelStoreDamage, NamesOfChecksumsAreNotRun)
+{
+    WriteBytes(m_path, BytesOf(QM_TEST_DATA "/model-v1.qmdb"));
+    CSqliteDb::OpenForWriting(m_path).Exec("INSERT INTO checksums VALUES('(WITH RECURSIVE n(key) "
+                                           "AS (SELECT 1 UNION ALL SELECT key + 1 "
+                                           "FROM n) SELECT key FROM n)', 0)");
+    EXPECT_EQ(1, Open()) << m_error.text;
 }
 
 /// Written by the program when it knew version 1 only, with one byte changed.

@@ -50,8 +50,8 @@ TEST_F(ModelStoreSave, NumbersThatAreNotFiniteAreRefused)
         const char* place;
         void (*spoil)(T_MODEL_CONTENT&, double);
     } cases[] = {
-        {"model 1 gravity", [](auto& c, double v) { c.model.styp.gravity = v; }},
-        {"nodes 0 xyz", [](auto& c, double v) { c.model.nodes[2].xyz[1] = v; }},
+        {"model gravity", [](auto& c, double v) { c.model.styp.gravity = v; }},
+        {"nodes 2 xyz", [](auto& c, double v) { c.model.nodes[2].xyz[1] = v; }},
         {"spectra 9 Sa",
          [](auto& c, double v) { std::get<T_SPFC_USER>(c.model.spectra[9].data).Sa[0] = v; }},
         {"results 1 displacement 5",
@@ -64,8 +64,8 @@ TEST_F(ModelStoreSave, NumbersThatAreNotFiniteAreRefused)
             T_MODEL_CONTENT content = RichContent();
             c.spoil(content, value);
             ExpectRefused(content, FILE_FAULT::BadInput, c.place);
-            EXPECT_EQ(MMSGFunction::Format("IDS_QM_DB_FILE_NOT_FINITE", {m_path, c.place}),
-                      m_error.text);
+            EXPECT_NE(std::string::npos, m_error.text.find(std::string("not saved: ") + c.place));
+            EXPECT_NE(std::string::npos, m_error.text.find("not a finite number")) << m_error.text;
         }
     }
 }
