@@ -1,5 +1,6 @@
 #include "qm_rps/ulfcalculation.h"
 
+#include "qm_base/finite.h"
 #include "qm_base/messagehistory.h"
 #include "qm_base/msgfunction.h"
 #include "qm_rps/factors/ulfstageplace.h"
@@ -60,8 +61,14 @@ std::optional<T_FINDING> MissesOf(const T_ULF_RESULT& result)
 T_ULF_CALCULATION Finished(T_ULF_RUN run, bool solved, const std::string& sourceError)
 {
     T_ULF_CALCULATION out;
-    if (solved) {
-        out.result = UlfResultOf(run, run.answer.factors);
+    if (solved) out.result = UlfResultOf(run, run.answer.factors);
+    if (out.result && !(IsFinite(*out.result) && IsFinite(UlfResultRows(*out.result)) &&
+                        IsFinite(UlfObjective(*out.result)))) {
+        constexpr const char* key = "IDS_QM_ULF_NOT_FINITE";
+        out.result.reset();
+        out.said = Saying(key, MMSGFunction::Format(key, {run.item.name}));
+        SaveHistory(out.said->text);
+    } else if (solved) {
         out.said = MissesOf(*out.result);
         SaveHistory(MMSGFunction::GetValue("IDS_RPS_Unknown_CAN_FIND_OPTIMIZED_SOLUTION"));
         if (out.said) SaveHistory(out.said->text);

@@ -5,6 +5,7 @@
 #include "qm_solver/solverreason.h"
 
 #include <string>
+#include <tuple>
 
 namespace solver {
 
@@ -37,6 +38,10 @@ struct T_RESULT {
     /// that of i), global axes, the same at all positions. Spring: 0.
     std::vector<std::array<T_VEC6, kBeamPositions>> force;
 };
+inline auto Numbers(const T_RESULT& r)
+{
+    return std::tie(r.displacement, r.reaction, r.force);
+}
 
 struct T_MODE {
     double omega2 = 0.0;       // squared circular frequency, 1/s2
@@ -45,6 +50,10 @@ struct T_MODE {
     T_VEC6 participation{};    // L / M per direction X, Y, Z; rotations about the origin
     T_VEC6 massPercent{};      // effective modal mass in per cent of the direction's total
 };
+inline auto Numbers(const T_MODE& m)
+{
+    return std::tie(m.omega2, m.period, m.shape, m.participation, m.massPercent);
+}
 
 enum class SOLVER_FAULT {
     None,

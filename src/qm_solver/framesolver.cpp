@@ -1,5 +1,6 @@
 #include "qm_solver/framesolver.h"
 
+#include "qm_base/finite.h"
 #include "qm_base/textformat.h"
 #include "qm_solver/checks/balance.h"
 #include "qm_solver/checks/mechanism.h"
@@ -73,6 +74,12 @@ std::optional<T_SOLVER_ERROR> CFrameSolver::T_STATE::SolveBlock(std::span<const 
             return error;
         }
     block.Recover(x, out);
+    for (std::size_t c = 0; c < cases.size(); ++c)
+        if (!IsFinite(out[first + c])) {
+            T_SOLVER_ERROR error = Failed("IDS_QM_ENGINE_OVERFLOW");
+            error.loadCase = static_cast<long>(first + c);
+            return error;
+        }
     return {};
 }
 

@@ -1,5 +1,6 @@
 #include "qm_solver/modesolver.h"
 
+#include "qm_base/finite.h"
 #include "qm_solver/checks/movement.h"
 #include "qm_solver/frame/eigensolver.h"
 #include "qm_solver/model/framemass.h"
@@ -127,7 +128,11 @@ int SolveModes(const T_FRAME& frame, const CFrameDofs& dofs, const T_SYMMETRIC_M
     for (std::size_t i = 0; i < found; ++i)
         out.push_back(
             Mode(pairs.lambda[i], shapes.col(static_cast<Index>(i)), dofs, excitation, total));
-    return 1;
+    if (IsFinite(out)) return 1;
+    out.clear();
+    error.fault = SOLVER_FAULT::Failed;
+    error.reason = "IDS_QM_ENGINE_OVERFLOW";
+    return 0;
 }
 
 } // namespace solver

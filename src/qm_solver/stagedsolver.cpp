@@ -1,5 +1,6 @@
 #include "qm_solver/stagedsolver.h"
 
+#include "qm_base/finite.h"
 #include "qm_solver/stages/stagedrun.h"
 
 #include <algorithm>
@@ -124,7 +125,9 @@ int CStagedSolver::Read(std::size_t stage, int step, std::span<const double> fac
     T_MIX mix;
     for (std::size_t c = 0; c < factors.size(); ++c)
         if (factors[c] != 0.0) mix.emplace_back(c, factors[c]);
-    return m_state->run->Read(stage, step, mix, out);
+    if (m_state->run->Read(stage, step, mix, out) && IsFinite(out)) return 1;
+    out = {};
+    return 0;
 }
 
 int CStagedSolver::ReadCase(std::size_t stage, int step, std::size_t loadCase, T_RESULT& out) const

@@ -78,8 +78,9 @@ std::vector<T_ULF_RESULT_ROW> UlfResultRows(const T_ULF_RESULT& r)
         const auto at = [&](const std::optional<double>& bound) {
             return bound && std::fabs(row.value - *bound) <= kActiveTolerance * scale;
         };
-        if (c.upper && row.value > *c.upper) row.residual = row.value - *c.upper;
-        if (c.lower && row.value < *c.lower) row.residual = row.value - *c.lower;
+        // A value that is not a number misses its bounds.
+        if (c.upper && !(row.value <= *c.upper)) row.residual = row.value - *c.upper;
+        if (c.lower && !(row.value >= *c.lower)) row.residual = row.value - *c.lower;
         row.met = std::fabs(row.residual) <= kMetTolerance * scale;
         row.active = at(c.upper) || at(c.lower) || row.residual != 0.0;
         rows.push_back(std::move(row));

@@ -25,6 +25,11 @@ struct T_ULF_RESULT {
     bool stage = false; // the cases are loads at a construction stage and step
 };
 
+inline auto Numbers(const T_ULF_RESULT& r)
+{
+    return std::tie(r.factors, r.influence);
+}
+
 /// One calculation of an item: what went into the optimizer and what came out.
 struct T_ULF_RUN {
     T_ULFI_D item;
@@ -62,6 +67,10 @@ struct T_ULF_RESULT_ROW {
     std::string place{}; // as of the constraint
     bool operator==(const T_ULF_RESULT_ROW&) const = default;
 };
+inline auto Numbers(const T_ULF_RESULT_ROW& r)
+{
+    return std::tie(r.value, r.upper, r.lower, r.residual);
+}
 
 /// Bounds of a constraint as the table shows them. Compared equalities have 0 as both: the
 /// difference of the two places.

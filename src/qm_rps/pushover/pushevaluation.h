@@ -15,6 +15,10 @@ struct T_PERF_POINT {
     double Teff = 0.0;             // secant period 2 pi sqrt(Sd / (Sa g))
     std::optional<double> damping; // where the procedure sets one
 };
+inline auto Numbers(const T_PERF_POINT& p)
+{
+    return std::tie(p.Sd, p.Sa, p.D, p.V, p.Teff, p.damping);
+}
 
 /// One row of the limit-state table; what the window shows as "-" is empty.
 struct T_LIMIT_ROW {
@@ -25,6 +29,10 @@ struct T_LIMIT_ROW {
     /// As tables show it, in the chosen language; "-" without one.
     std::string RemarkText() const;
 };
+inline auto Numbers(const T_LIMIT_ROW& r)
+{
+    return std::tie(r.demand, r.capacity);
+}
 
 /// Remark of a state whose capacity rests on data that are missing.
 inline constexpr const char* kNotChecked = "not checked";
@@ -100,3 +108,9 @@ struct T_PUSH_EVALUATION {
         return eval.method == PUSH_METHOD::Ec8Opcm && eval.masonry.value_or(false);
     }
 };
+/// What a reader takes from the result.
+inline auto Numbers(const T_PUSH_EVALUATION& e)
+{
+    return std::tie(e.factors, e.mStar, e.capacity, e.point, e.allPoints, e.bilinear, e.targets,
+                    e.limitStates);
+}

@@ -1,5 +1,6 @@
 #include "qm_rps/pushover/pushevaluator.h"
 
+#include "qm_base/finite.h"
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_db/filectrl.h"
@@ -160,7 +161,23 @@ int CPushEvaluator::Evaluate()
     else
         ForgetSteps();
     FillResult();
+    if (!IsFinite(m_result)) GiveUp();
     return m_result.result;
+}
+
+// Nothing of a result stands when one of its numbers is not finite.
+void CPushEvaluator::GiveUp()
+{
+    T_PUSH_EVALUATION none;
+    none.eval = m_result.eval;
+    none.procedure = m_result.procedure;
+    none.loadCase = m_result.loadCase;
+    none.units = m_result.units;
+    none.gammaNote = m_result.gammaNote;
+    if (none.IsTarget()) none.limitStates = CPushOverTargetEvaluation::EmptyRows(m_eval.method);
+    m_result = std::move(none);
+    (void)Fail(PUSH_OUTCOME::NotFinite, "IDS_QM_ADVICE_NOT_FINITE");
+    ForgetSteps();
 }
 
 // The spectrum of the record at its own damping; NTC gives the state SLV here.

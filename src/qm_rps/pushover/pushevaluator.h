@@ -84,6 +84,7 @@ private:
     int CheckCurve();
     void WarnAboutCurve();
     void FillResult();
+    void GiveUp();
     void PlotCurve();
     void Say(const char* key, std::initializer_list<std::string_view> values = {});
     int Fail(PUSH_OUTCOME code, const char* key);

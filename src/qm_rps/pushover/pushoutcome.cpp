@@ -14,7 +14,7 @@ struct T_KEYS {
 
 // In the order of PUSH_OUTCOME.
 // clang-format off
-constexpr std::array<T_KEYS, 31> kKeys{{
+constexpr std::array<T_KEYS, 32> kKeys{{
     {"", ""},
     {"IDS_QM_OUTCOME_CONVERGED", "IDS_QM_ADVICE_CONVERGED"},
     {"IDS_QM_OUTCOME_ELASTIC", "IDS_QM_ADVICE_ELASTIC"},
@@ -46,9 +46,10 @@ constexpr std::array<T_KEYS, 31> kKeys{{
     {"IDS_QM_OUTCOME_TARGET_BELOW", "IDS_QM_ADVICE_TARGET_BELOW"},
     {"IDS_QM_OUTCOME_TARGET_CYCLES", "IDS_QM_ADVICE_TARGET_CYCLES"},
     {"IDS_QM_OUTCOME_NEGATIVE_GAMMA", "IDS_QM_ADVICE_NEGATIVE_GAMMA"},
+    {"IDS_QM_OUTCOME_NOT_FINITE", "IDS_QM_ADVICE_NOT_FINITE"},
 }};
 // clang-format on
-static_assert(kKeys.size() == static_cast<std::size_t>(PUSH_OUTCOME::NegativeGamma) + 1);
+static_assert(kKeys.size() == static_cast<std::size_t>(PUSH_OUTCOME::NotFinite) + 1);
 
 } // namespace
 

@@ -32,10 +32,11 @@ enum class PUSH_OUTCOME {
     BilinearTooShort,
     ZeroDemand,
     TargetBeyond,
-    TrialBeyond,  // no trial point either: the capacity ends before it
-    TargetBelow,  // the curve starts beyond the target
-    TargetCycles, // iterated bilinear curves do not settle
-    NegativeGamma // the control node moves against the mode
+    TrialBeyond,   // no trial point either: the capacity ends before it
+    TargetBelow,   // the curve starts beyond the target
+    TargetCycles,  // iterated bilinear curves do not settle
+    NegativeGamma, // the control node moves against the mode
+    NotFinite      // a number of the result is too large for any
 };
 
 /// An outcome with its numbers, where it has some.

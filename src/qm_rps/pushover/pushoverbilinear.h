@@ -18,6 +18,10 @@ struct T_BILINEAR {
     double du = 0.0, au = 0.0;
     bool operator==(const T_BILINEAR&) const = default;
 };
+inline auto Numbers(const T_BILINEAR& b)
+{
+    return std::tie(b.dy, b.ay, b.du, b.au);
+}
 
 /// Defaults of a rule: ntc 0.6 and 0.85 (NTC C7.3.4.2), masonry 0.7 and 0.8 (C7.8.1.6).
 T_BILINEAR_OPTIONS BilinearDefaults(BILINEAR_RULE rule);

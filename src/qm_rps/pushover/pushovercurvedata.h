@@ -52,6 +52,10 @@ struct T_PUSH_FACTORS {
     int mode = 0; // eigen mode used; 0 none
     bool operator==(const T_PUSH_FACTORS&) const = default;
 };
+inline auto Numbers(const T_PUSH_FACTORS& f)
+{
+    return std::tie(f.gamma, f.alpha, f.mass, f.weight, f.gravity);
+}
 
 class CPushOverCurveData {
 public:

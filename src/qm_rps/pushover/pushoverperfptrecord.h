@@ -21,6 +21,10 @@ struct T_ADRS_CURVE {
     T_ADRS_VIEW View() const { return {Sd, Sa}; }
     bool operator==(const T_ADRS_CURVE&) const = default;
 };
+inline auto Numbers(const T_ADRS_CURVE& c)
+{
+    return std::tie(c.Sd, c.Sa);
+}
 
 /// One trial of a procedure; what a procedure does not have stays empty.
 struct T_PERFPT_TRIAL {

@@ -31,6 +31,10 @@ struct T_TARGET_DISP {
     T_OUTCOME outcome;
     bool operator==(const T_TARGET_DISP&) const = default;
 };
+inline auto Numbers(const T_TARGET_DISP& t)
+{
+    return std::tie(t.Tstar, t.Tc, t.Se, t.ay, t.dy, t.Fy, t.mStar, t.det, t.dt, t.qu);
+}
 
 /// Elastic and inelastic target displacement of a bilinear system. EN 1998-1 (B.7) to (B.9).
 /// `capAt3` limits dt to 3 det: Eurocode 8 does, NTC does not. Fills everything but Fy and mStar;
