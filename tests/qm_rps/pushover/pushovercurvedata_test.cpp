@@ -7,7 +7,7 @@
 namespace {
 
 using P = PLOT_TYPE;
-using Numbers = std::vector<double>;
+using T_NUMBERS = std::vector<double>;
 
 T_MODEL_CONTENT Sample()
 {
@@ -24,7 +24,7 @@ T_PUSH_CURVE_SETTINGS Settings(PLOT_TYPE type, bool eigenFactors = true)
     return s;
 }
 
-void ExpectNear(const Numbers& expected, const Numbers& actual, const std::string& label)
+void ExpectNear(const T_NUMBERS& expected, const T_NUMBERS& actual, const std::string& label)
 {
     ASSERT_EQ(expected.size(), actual.size()) << label;
     for (std::size_t i = 0; i < expected.size(); ++i)
@@ -128,7 +128,7 @@ TEST_F(CurveData, StartsAtATenthOfTheFirstStepAndTransformsByPlotType)
     struct T_ROW {
         P type;
         double dx; // factor on 0.03, 0.09, 0.06 m
-        Numbers y;
+        T_NUMBERS y;
     };
     const T_ROW rows[] = {
         {P::BaseReaction, 1.0, {1.0, 10.0, 18.0, 20.0}},
@@ -162,7 +162,7 @@ TEST_F(CurveData, ExtraNodesKeepTheirZeroAndRaiseTheLargestDisplacement)
     ASSERT_EQ(1, Calc(s));
     ExpectNear({0.0, 0.1 / kGamma, 0.7 / kGamma}, m_curve.ExtraDisplacement(0), "1");
     for (std::size_t i = 1; i < 4; ++i)
-        EXPECT_EQ((Numbers{0, 0, 0}), m_curve.ExtraDisplacement(i));
+        EXPECT_EQ((T_NUMBERS{0, 0, 0}), m_curve.ExtraDisplacement(i));
     EXPECT_DOUBLE_EQ(0.7 / kGamma, m_curve.MaxDisplacement());
 }
 
@@ -195,7 +195,7 @@ TEST_F(CurveData, OtherDirections)
     EXPECT_DOUBLE_EQ(1.5, m_curve.Factors().mass);
     calc(5, false); // a rotation has no mass
     EXPECT_TRUE(m_curve.ConversionError() && m_curve.MassError());
-    EXPECT_EQ((Numbers{0, 0, 0, 0}), m_curve.Force());
+    EXPECT_EQ((T_NUMBERS{0, 0, 0, 0}), m_curve.Force());
 }
 
 TEST_F(CurveData, RefusesWhatCanNotBeRead)
