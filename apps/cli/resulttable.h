@@ -1,7 +1,7 @@
 // Results as short text tables for the terminal.
 #pragma once
 
-#include "qm_rps/pushover/pushovercomparison.h"
+#include "qm_rps/pushover/evaluation/pushovercomparison.h"
 
 #include <string>
 #include <vector>

@@ -1,6 +1,6 @@
 #include "qm_rps/pushoveradditionalstepdlg.h"
 
-#include "qm_rps/pushover/pushevaluator.h"
+#include "qm_rps/pushover/evaluation/pushevaluator.h"
 #include "qm_rps/pushover/refusal.h"
 
 #include <algorithm>

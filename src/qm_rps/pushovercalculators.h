@@ -1,7 +1,7 @@
 // The performance-point calculators by method and procedure.
 #pragma once
 
-#include "qm_rps/pushover/pushevaluator.h"
+#include "qm_rps/pushover/evaluation/pushevaluator.h"
 #include "qm_rps/pushovercalcperfptbase.h"
 
 #include <memory>

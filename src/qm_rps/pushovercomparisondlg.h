@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_rps/dialog/texttable.h"
-#include "qm_rps/pushover/pushovercomparison.h"
+#include "qm_rps/pushover/evaluation/pushovercomparison.h"
 
 #include <functional>
 

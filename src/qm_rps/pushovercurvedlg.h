@@ -6,7 +6,7 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
-#include "qm_rps/pushover/pushevaluator.h"
+#include "qm_rps/pushover/evaluation/pushevaluator.h"
 #include "qm_rps/pushoveradditionalstepdlg.h"
 
 class CPushOverCurveDlg : public zql::frx::MDialog {

@@ -4,7 +4,7 @@
 #include "qm_db/editscope.h"
 #include "qm_db/recordfacts.h"
 #include "qm_rps/desk/recordnames.h"
-#include "qm_rps/pushover/pushoverreport.h"
+#include "qm_rps/pushover/report/pushoverreport.h"
 #include "qm_rps/pushovercomparisondlg.h"
 #include "qm_rps/pushovertextdlg.h"
 

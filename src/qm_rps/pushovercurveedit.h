@@ -5,7 +5,7 @@
 // last picture and values, with the reason.
 #pragma once
 
-#include "qm_rps/pushover/shownevaluation.h"
+#include "qm_rps/pushover/report/shownevaluation.h"
 #include "qm_rps/pushovercurvedlg.h"
 #include "qm_rps/pushovercurvesub1dlg.h"
 #include "qm_rps/pushovercurvesub2dlg.h"

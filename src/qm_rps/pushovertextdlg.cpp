@@ -1,7 +1,7 @@
 #include "qm_rps/pushovertextdlg.h"
 
 #include "qm_base/say.h"
-#include "qm_rps/pushover/pushoverreport.h"
+#include "qm_rps/pushover/report/pushoverreport.h"
 
 #include <filesystem>
 

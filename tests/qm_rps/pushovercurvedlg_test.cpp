@@ -2,7 +2,7 @@
 
 #include "pushsample.h"
 #include "qm_base/appbase.h"
-#include "qm_rps/pushover/pushovercells.h"
+#include "qm_rps/pushover/report/pushovercells.h"
 
 #include <algorithm>
 #include <gtest/gtest.h>

@@ -2,7 +2,7 @@
 
 #include "numbers.h"
 #include "pushsample.h"
-#include "qm_rps/pushover/pushovercells.h"
+#include "qm_rps/pushover/report/pushovercells.h"
 #include "scriptview.h"
 
 #include <algorithm>

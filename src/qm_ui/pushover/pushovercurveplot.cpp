@@ -2,7 +2,7 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
-#include "qm_rps/pushover/pushovercells.h"
+#include "qm_rps/pushover/report/pushovercells.h"
 #include "qm_rps/pushovercurvedampparamuser.h"
 #include "qm_ui/pushover/evaluationplot.h"
 

@@ -1,7 +1,7 @@
 #include "qm_ui/pushover/pushovercurveview.h"
 
 #include "qm_base/msgfunction.h"
-#include "qm_rps/pushover/pushovercells.h"
+#include "qm_rps/pushover/report/pushovercells.h"
 #include "qm_ui/plot/plotdrawing.h"
 #include "qm_ui/plot/plotfile.h"
 #include "qm_ui/pushover/pushovercurveplot.h"

@@ -1,4 +1,4 @@
-#include "qm_rps/pushover/pushoverreport.h"
+#include "qm_rps/pushover/report/pushoverreport.h"
 
 #include "pushsample.h"
 #include "tempfolder.h"

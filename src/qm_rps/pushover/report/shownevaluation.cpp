@@ -1,7 +1,7 @@
-#include "qm_rps/pushover/shownevaluation.h"
+#include "qm_rps/pushover/report/shownevaluation.h"
 
 #include "qm_base/msgfunction.h"
-#include "qm_rps/pushover/pushovercells.h"
+#include "qm_rps/pushover/report/pushovercells.h"
 
 #include <algorithm>
 

@@ -6,8 +6,8 @@
 #pragma once
 
 #include "qm_base/finding.h"
+#include "qm_rps/pushover/evaluation/pushtargetinput.h"
 #include "qm_rps/pushover/pushevaluation.h"
-#include "qm_rps/pushover/pushtargetinput.h"
 
 /// Most additional steps, and most additional performance points, that are kept.
 inline constexpr std::size_t kMaxAdditional = 10;

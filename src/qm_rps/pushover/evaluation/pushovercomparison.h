@@ -1,7 +1,7 @@
 // Every applicable method on one capacity curve with one spectrum, side by side.
 #pragma once
 
-#include "qm_rps/pushover/pushevaluator.h"
+#include "qm_rps/pushover/evaluation/pushevaluator.h"
 
 struct T_COMPARISON_ROW {
     std::string label; // "ATC-40 A", "EC8 SD", "NTC2018 SLV"

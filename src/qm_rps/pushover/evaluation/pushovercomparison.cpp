@@ -1,4 +1,4 @@
-#include "qm_rps/pushover/pushovercomparison.h"
+#include "qm_rps/pushover/evaluation/pushovercomparison.h"
 
 #include <algorithm>
 

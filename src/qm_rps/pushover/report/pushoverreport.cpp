@@ -1,4 +1,4 @@
-#include "qm_rps/pushover/pushoverreport.h"
+#include "qm_rps/pushover/report/pushoverreport.h"
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"

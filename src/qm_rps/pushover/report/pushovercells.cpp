@@ -1,9 +1,9 @@
-#include "qm_rps/pushover/pushovercells.h"
+#include "qm_rps/pushover/report/pushovercells.h"
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/pushover/fema440coefficients.h"
-#include "qm_rps/pushover/pushoverreport.h"
+#include "qm_rps/pushover/report/pushoverreport.h"
 
 #include <cmath>
 

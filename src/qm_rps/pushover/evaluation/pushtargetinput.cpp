@@ -1,4 +1,4 @@
-#include "qm_rps/pushover/pushtargetinput.h"
+#include "qm_rps/pushover/evaluation/pushtargetinput.h"
 
 T_BILINEAR_OPTIONS BilinearOptionsOf(const T_EVAL_D& evaluation)
 {
