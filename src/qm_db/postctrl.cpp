@@ -114,6 +114,14 @@ int CPostCtrl::GetEiMpam(int mode, T_MPAM_D& out) const
     return 1;
 }
 
+int CPostCtrl::CalcEiParticipation(int mode, T_MPAF_D& factor, T_MPAM_D& percent) const
+{
+    const auto it = m_data.Model().modes.find(mode);
+    if (it == m_data.Model().modes.end()) return 0;
+    DeriveParticipation(it->second, factor, percent);
+    return 1;
+}
+
 IPushResult* CPostCtrl::Source() const
 {
     const auto it = m_data.Content().results.find(m_pushover);
@@ -227,6 +235,28 @@ int CPostCtrl::GetDispNew(int node, double& displacement)
 bool CPostCtrl::ExistNodePost(int node) const
 {
     return Source() && Source()->HasNode(node);
+}
+
+// The series are not kept: there may be many nodes.
+int CPostCtrl::FindControlNode(int& node)
+{
+    IPushResult* source = Source();
+    if (!source || source->StepCount() == 0) return 0;
+    double largest = -1.0;
+    int found = 0;
+    std::vector<double> values;
+    for (const int id : source->NodeIds()) {
+        if (!source->ReadDisplacements(id, values)) {
+            m_error = source->Error();
+            return 0;
+        }
+        if (!(std::fabs(values.back()) > largest)) continue;
+        largest = std::fabs(values.back());
+        found = id;
+    }
+    if (found == 0) return 0;
+    node = found;
+    return 1;
 }
 
 // In the units of the document; a level without results adds its height to the next one.

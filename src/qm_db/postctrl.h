@@ -56,6 +56,8 @@ public:
     /// masses and the shape (factor = L / M; percent = 100 L2 / (M total)). 1 done; 0 no such mode.
     [[nodiscard]] int GetEiMpafNeutral(int mode, T_MPAF_D& out) const;
     [[nodiscard]] int GetEiMpam(int mode, T_MPAM_D& out) const;
+    /// Both from the nodal masses and the shape, whatever is recorded. As above.
+    [[nodiscard]] int CalcEiParticipation(int mode, T_MPAF_D& factor, T_MPAM_D& percent) const;
 
     /// Selects the pushover load case whose steps are read. 1 done; 0 it has no results.
     [[nodiscard]] int SelectPushover(int loadCase);
@@ -68,6 +70,9 @@ public:
     [[nodiscard]] int GetReacNew(double& reaction);
     [[nodiscard]] int GetDispNew(int node, double& displacement);
     bool ExistNodePost(int node) const;
+    /// The node with results that has moved most in the control direction at the last step, the
+    /// smallest id of several. 1 found; 0 no steps, or not readable (Error), output as it was.
+    [[nodiscard]] int FindControlNode(int& node);
 
     /// A combination of one static load case (by key), for SelectLoadCombNew.
     static T_LCOM_D MakeLoadComb(int loadCase, double factor = 1.0);

@@ -159,6 +159,8 @@ struct T_POLC_D {
     std::vector<int> modes;                  // mode numbers that the pattern names, in order
     std::vector<T_POLC_PATTERN> patterns{};  // pattern rows, may be empty
     std::optional<T_POLC_CONTROL> control{}; // absent for a case from another solver
+    int controlOption = 1; // 1: the node named above; else evaluations take the one that has moved
+                           // most at the last step
     bool operator==(const T_POLC_D&) const = default;
 };
 
@@ -171,8 +173,12 @@ struct T_EVAL_BILINEAR {
     std::optional<double> secant;    // fraction of the strength that fixes the stiffness, (0, 1]
     std::optional<double> drop;      // fraction of the strength that ends the curve, (0, 1]
     std::optional<bool> iterate;     // EN 1998-1 B.3 iteration; absent: false
+    std::optional<std::string> strength{}; // yield strength: "rule" or "peak"; absent: "rule"
     bool operator==(const T_EVAL_BILINEAR&) const = default;
 };
+
+/// Most further nodes that an evaluation follows.
+inline constexpr std::size_t kMostMonitoredNodes = 4;
 
 /// One evaluation: a pushover load case, a method, a spectrum. Absent options have defaults.
 struct T_EVAL_D {
@@ -190,6 +196,8 @@ struct T_EVAL_D {
     std::optional<int> plotType;                      // 0 to 8; absent: the method's own
     std::optional<bool> alphaInPercent;               // absent: false
     std::optional<T_EVAL_BILINEAR> bilinear;
+    std::optional<double> weight{};    // force; stands in where the model has no vertical mass
+    std::vector<int> monitoredNodes{}; // further nodes whose displacement is shown, up to 4
     bool operator==(const T_EVAL_D&) const = default;
 };
 

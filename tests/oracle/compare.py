@@ -86,6 +86,12 @@ class Compare:
             return
         self.record(name, "performance_point", POINT, a.get("performance_point"),
                     b.get("performance_point"))
+        if a.get("performance_point") and b.get("performance_point"):
+            self.record(name, "first_slope_change", ["Sd", "Sa"], a.get("first_slope_change"),
+                        b.get("first_slope_change"))
+            periods = [[v for p in r.get("periods_by_ductility") or []
+                        for v in (p["mu"], p["T_eff"])] for r in (a, b)]
+            self.array(name, "periods_by_ductility", *periods)
         if str(a.get("method")).startswith("NTC"):
             self.states(name, "target", [k for k in TARGET], "limit_state", self.reached(a),
                         self.reached(b))

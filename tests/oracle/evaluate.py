@@ -332,6 +332,9 @@ class Curve:
     def __init__(self, case, push, method, eigen, g):
         self.case, self.push, self.g = case, push, g
         self.node, self.dir = push["control_node"], DIRECTIONS.index(push["direction"])
+        if push.get("control_option", 1) != 1:  # the node that has moved most at the end
+            last = {int(k): abs(v[-1]) for k, v in push["steps"]["displacement"].items()}
+            self.node = min(last, key=lambda k: (-last[k], k))
         kind = PATTERNS[push["pattern"]["kind"]]
         if kind == 1 and method in ("EC8/OPCM", "NTC2008", "NTC2018"):
             eigen = False
@@ -439,6 +442,7 @@ class PerformancePoint:
         self.sa5 = [spectrum.at(t) for t in spectrum.T]
         self.sd5 = to_adrs(spectrum.T, self.sa5, self.g)
         self.trials = 0
+        self.periods = []  # by ductility, of ATC-40 B
         self.by_rounding = False  # the answer hangs on the last bits: see README
 
     # -- common operations
@@ -451,6 +455,25 @@ class PerformancePoint:
         if not trial:
             raise Fail("trial point not found")
         return demand, trial
+
+    def slope_change(self):
+        """First point where the ratio of relative growths changes by more than 0.1, or None."""
+        d, a = self.Sd, self.Sa
+
+        def ratio(i):
+            try:
+                return (a[i + 1] / a[i] - 1.0) / (d[i + 1] / d[i] - 1.0)
+            except ZeroDivisionError:
+                return math.nan
+        for i in range(len(d) - 2):
+            if abs(d[i] * a[i]) < 1e-26 or abs(d[i + 1] * a[i + 1]) < 1e-26:
+                return None
+            change = abs(ratio(i) - ratio(i + 1))
+            if not math.isfinite(change):
+                return None
+            if change > 0.1:
+                return {"Sd": d[i + 1], "Sa": a[i + 1]}
+        return None
 
     def t0(self):
         return 2.0 * PI * root(div(self.Sd[1], self.Sa[1] * self.g))
@@ -591,6 +614,7 @@ class PerformancePoint:
         demand, (dp, ap) = self.initial()
         t0 = self.t0()
         trace, betas = [demand], [5.0]
+        self.periods = [{"mu": 1.0, "T_eff": t0}]
         dy, ay = self.bilinearize(dp, ap)
         mu = 1.2
         while mu <= 10.0:
@@ -601,6 +625,8 @@ class PerformancePoint:
             self.trials += 1
             alpha = div(div(a, ay) - 1.0, div(d, dy) - 1.0)
             teff = t0 * root(div(mu, alpha * mu + 1.0 - alpha))
+            if any(abs(mu - m) <= 1e-13 for m in (2.0, 4.0, 6.0, 8.0)):
+                self.periods.append({"mu": float(round(mu)), "T_eff": teff})
             sra, srv, beta = self.reduction(dy, ay, d, a)
             sa = self.spectrum.reduced(sra, srv, self.behavior)
             hit = radial_crossing(1.0, div(4.0 * PI * PI, teff * teff * self.g),
@@ -761,6 +787,7 @@ class Target:
         self.secant = opt.get("secant", 0.7 if self.rule == "masonry" else 0.6)
         self.drop = opt.get("drop", 0.8 if self.rule == "masonry" else 0.85)
         self.iterate = opt.get("iterate", False)
+        self.strongest = opt.get("strength", "rule") == "peak"
 
     # -- bilinear idealisation
 
@@ -779,6 +806,11 @@ class Target:
             if i is None:
                 raise Fail("bilinear: displacement beyond the curve")
             at = ys[i] + (ys[i + 1] - ys[i]) * div(dm - xs[i], xs[i + 1] - xs[i])
+        if self.strongest:
+            at_dm, at = at, max([at] + ys[:i + 1])
+            dy = min(dm, 2.0 * (dm - div(area_along(xs, ys, i, dm, at_dm), at)))
+            self.set_bilinear(dy, at, self.xs[-1])
+            return
         dy = min(dm, 2.0 * (dm - div(area_along(xs, ys, i, dm, at), at)))
         self.set_bilinear(dy, at, self.xs[-1])
 
@@ -798,6 +830,9 @@ class Target:
                 du = xs[i] + (xs[i + 1] - xs[i]) * div(ys[i] - fall, ys[i] - ys[i + 1])
                 end = (i, fall)
                 break
+        if self.strongest:
+            self.set_bilinear(top / k, top, du)
+            return
         inner = du * du - 2.0 * area_along(xs, ys, end[0], du, end[1]) / k
         ay = k * (du - math.sqrt(inner)) if inner >= 0.0 else top
         self.set_bilinear(ay / k, ay, du)
@@ -1034,6 +1069,8 @@ def evaluate(case, ev):
                    "FEMA440": {"A": lambda: solver.fema_ab(0), "B": lambda: solver.fema_ab(1),
                                "C": solver.fema_c}}[method][proc]
             d, a, beta, is_elastic = run()
+            out["first_slope_change"] = solver.slope_change()
+            out["periods_by_ductility"] = [] if is_elastic else solver.periods
             point = curve.point(d, a, beta)
             if not finite(point):
                 raise Fail("result is not finite")

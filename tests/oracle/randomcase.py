@@ -206,8 +206,9 @@ class Maker:
         pattern = {"kind": r.choice(["static", "acceleration", "mode", "mode x story mass"])}
         if pattern["kind"].startswith("mode"):
             pattern["modes"] = [self.main_mode]
-        return {"name": name, "control_node": control, "direction": ["DX", "DY"][d],
-                "pattern": pattern,
+        option = 1 if self.exact or r.random() < 0.8 else 2
+        return {"name": name, "control_node": control, "control_option": option,
+                "direction": ["DX", "DY"][d], "pattern": pattern,
                 "steps": {"load_factor": [num((i + 1) / len(xs)) for i in range(len(xs))],
                           "base_reaction": [num(v) for v in shear], "displacement": table}}, \
             (kind, self.exact, self.fold)
@@ -301,6 +302,8 @@ class Maker:
                     b["drop"] = num(r.uniform(0.5, 0.97))
             elif method == "EC8/OPCM" and r.random() < 0.6:
                 b["iterate"] = True
+            if not exact and r.random() < 0.25:
+                b["strength"] = "peak"
             ev["bilinear"] = b
         return ev
 

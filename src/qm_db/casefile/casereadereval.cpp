@@ -27,8 +27,8 @@ void JudgeEvaluation(CJsonReader& in, const T_MODEL& model, const T_EVAL_D& eval
         in.FailAt("push", "IDS_QM_CASE_NO_PUSHOVER", QuotedText(eval.push));
     if (!HasName(model.spectra, eval.spectrum))
         in.FailAt("spectrum", "IDS_QM_CASE_NO_SPECTRUM", QuotedText(eval.spectrum));
-    for (const char* const key :
-         {"behavior", "elastic_damping", "user_damping", "drift_kind", "plot_type"})
+    for (const char* const key : {"behavior", "elastic_damping", "user_damping", "drift_kind",
+                                  "plot_type", "weight", "monitored_nodes"})
         Judge(in, key, eval);
     if (!eval.bilinear) return;
     CJsonReader bilinear = in.Member("bilinear");

@@ -22,3 +22,4 @@ inline constexpr std::array<const char*, 5> kMethodNames{"FEMA440", "ATC-40", "E
 inline constexpr int kFirstMethod = static_cast<int>(PUSH_METHOD::Fema440);
 inline constexpr std::array<const char*, 3> kProcedures{"A", "B", "C"};
 inline constexpr std::array<const char*, 3> kBilinearRules{"ec8", "ntc", "masonry"};
+inline constexpr std::array<const char*, 2> kStrengthRules{"rule", "peak"};

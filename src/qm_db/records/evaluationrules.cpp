@@ -24,6 +24,14 @@ bool IsFraction(const std::optional<double>& v)
     return !v || (*v > 0.0 && *v <= 1.0); // a NaN fails
 }
 
+/// Up to four, none of them twice.
+bool AreFewNodes(const E& e)
+{
+    std::vector<int> nodes = e.monitoredNodes;
+    std::ranges::sort(nodes);
+    return nodes.size() <= kMostMonitoredNodes && std::ranges::adjacent_find(nodes) == nodes.end();
+}
+
 // beta1, kappa1, beta2, kappa2
 bool HasPoints(const E& e)
 {
@@ -82,6 +90,16 @@ constexpr T_RECORD_RULE<E> kRules[] = {
      [](const E& e) { return !e.bilinear || IsFraction(e.bilinear->secant); }},
     {{.message = kFraction, .field = "bilinear.drop", .caseKey = "drop", .reason = kFractionReason},
      [](const E& e) { return !e.bilinear || IsFraction(e.bilinear->drop); }},
+    {{.message = "IDS_QM_EVAL_WEIGHT",
+      .field = "weight",
+      .caseKey = "weight",
+      .reason = "IDS_QM_CASE_ABOVE_0"},
+     [](const E& e) { return !e.weight || (*e.weight > 0.0 && std::isfinite(*e.weight)); }},
+    {{.message = "IDS_QM_EVAL_MONITORED",
+      .field = "monitoredNodes",
+      .caseKey = "monitored_nodes",
+      .reason = "IDS_QM_EVAL_MONITORED"},
+     AreFewNodes},
 };
 
 /// Its message names method and procedure.
@@ -112,6 +130,11 @@ constexpr T_RECORD_RULE<T_REFERENCES> kReferences[] = {
      [](const T_REFERENCES& r) { return HasName(r.model.pushovers, r.evaluation.push); }},
     {{.message = "IDS_QM_UI_PUSH_NO_SPECTRUM", .field = "spectrum"},
      [](const T_REFERENCES& r) { return HasName(r.model.spectra, r.evaluation.spectrum); }},
+    {{.message = "IDS_QM_EVAL_NO_NODE", .field = "monitoredNodes"},
+     [](const T_REFERENCES& r) {
+         return std::ranges::all_of(r.evaluation.monitoredNodes,
+                                    [&](int node) { return r.model.nodes.contains(node); });
+     }},
 };
 
 } // namespace

@@ -45,6 +45,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_POLC_D> r)
     });
     v.List("patterns", r.patterns);
     v.PartIf("control", r.control);
+    v.Opt("control_option", r.controlOption, 1);
 }
 
 /// They stand in the load case that they belong to.
@@ -176,6 +177,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_EVAL_BILINEAR> r)
     v.OptIf("secant", r.secant);
     v.OptIf("drop", r.drop);
     v.OptIf("iterate", r.iterate);
+    v.WordIf("strength", r.strength, kStrengthRules, "IDS_QM_CHOICE_STRENGTH_RULE");
 }
 
 template <class V>
@@ -198,4 +200,6 @@ void CaseFields(V& v, T_FIELD_REF<V, T_EVAL_D> r)
     v.OptIf("plot_type", r.plotType);
     v.OptIf("alpha_in_percent", r.alphaInPercent);
     v.PartIf("bilinear", r.bilinear);
+    v.OptIf("weight", r.weight, kDimForce);
+    v.OptNodes("monitored_nodes", r.monitoredNodes);
 }

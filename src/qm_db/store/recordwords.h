@@ -147,6 +147,11 @@ public:
         if (!Me().Cell(key, ids)) Me().Body().NodeList(key, ids);
     }
     template <class T>
+    void OptNodes(const char* key, T& ids)
+    {
+        if (!Me().Cell(key, ids)) Me().Body().OptNodes(key, ids);
+    }
+    template <class T>
     void StageStep(const char* key, T& step, int missing)
     {
         Me().Body().StageStep(key, step, missing);

@@ -75,9 +75,11 @@ double AreaTo(const T_ADRS_VIEW& c, const T_CURVE_PLACE& place)
     return sum + (c.Sa[place.before] + place.Sa) / 2.0 * (place.Sd - c.Sd[place.before]);
 }
 
-int CalcBilinearEc8(const T_ADRS_VIEW& curve, const T_CURVE_PLACE& dm, T_BILINEAR& out)
+int CalcBilinearEc8(const T_ADRS_VIEW& curve, const T_CURVE_PLACE& dm, bool peak, T_BILINEAR& out)
 {
-    const double ay = dm.Sa;
+    double ay = dm.Sa;
+    for (std::size_t i = 0; peak && i <= dm.before; ++i)
+        ay = std::max(ay, curve.Sa[i]);
     if (!(ay > 0.0) || !(dm.Sd > 0.0)) return 0;
     const double dy = std::min(2.0 * (dm.Sd - AreaTo(curve, dm) / ay), dm.Sd);
     if (!(dy > 0.0)) return 0;
@@ -95,7 +97,7 @@ int CalcBilinearNtc(const T_ADRS_VIEW& curve, const T_BILINEAR_OPTIONS& options,
     const T_CURVE_PLACE end = FirstFall(curve, peak, options.drop * Fbu);
     const double du = end.Sd;
     const double root = du * du - 2.0 * AreaTo(curve, end) / k;
-    const double ay = root >= 0.0 ? k * (du - std::sqrt(root)) : Fbu;
+    const double ay = options.peak || root < 0.0 ? Fbu : k * (du - std::sqrt(root));
     if (!(ay > 0.0) || !std::isfinite(ay)) return 0;
     out = {ay / k, ay, du, ay};
     return 1;

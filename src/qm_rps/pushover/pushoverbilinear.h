@@ -10,6 +10,7 @@ struct T_BILINEAR_OPTIONS {
     double secant = 0.6;  // fraction of the strength that fixes the stiffness (ntc, masonry)
     double drop = 0.85;   // fraction of the strength that ends the curve (ntc, masonry)
     bool iterate = false; // EN 1998-1 B.3: repeat with the target displacement (ec8)
+    bool peak = false;    // the yield force is the largest force, not that of the rule
 };
 
 /// Points of the bilinear curve: origin, yield (dy, ay), ultimate (du, au). Lengths, g.
@@ -45,13 +46,13 @@ T_CURVE_PLACE FirstPlaceAt(const T_ADRS_VIEW& curve, double d);
 /// behind the place does not count.
 double AreaTo(const T_ADRS_VIEW& curve, const T_CURVE_PLACE& place);
 
-/// EN 1998-1 Annex B.3: equal energy up to the place of dm, yield force = force there. `curve`
-/// starts at the origin. 1 done; 0 no yield point (no force, or too little energy), output as it
-/// was.
-[[nodiscard]] int CalcBilinearEc8(const T_ADRS_VIEW& curve, const T_CURVE_PLACE& dm,
+/// EN 1998-1 Annex B.3: equal energy up to the place of dm, yield force = force there; `peak`: the
+/// largest force up to there. `curve` starts at the origin. 1 done; 0 no yield point (no force, or
+/// too little energy), output as it was.
+[[nodiscard]] int CalcBilinearEc8(const T_ADRS_VIEW& curve, const T_CURVE_PLACE& dm, bool peak,
                                   T_BILINEAR& out);
 
 /// NTC C7.3.4.2: secant through a fraction of the peak, equal area to the displacement where the
-/// force has dropped. As above.
+/// force has dropped; options.peak: the peak itself, on the secant. As above.
 [[nodiscard]] int CalcBilinearNtc(const T_ADRS_VIEW& curve, const T_BILINEAR_OPTIONS& options,
                                   T_BILINEAR& out);

@@ -1,9 +1,12 @@
 #include "qm_rps/pushover/pushovercurvedata.h"
 
+#include "qm_base/msgfunction.h"
 #include "qm_db/storyload.h"
 
 #include <algorithm>
 #include <cmath>
+
+using zql::lib::MMSGFunction;
 
 namespace {
 
@@ -44,15 +47,16 @@ int CPushOverCurveData::BeforePreparePOCurveData(const T_PUSH_CURVE_SETTINGS& se
     m_conversionError = m_storeyWithoutMass = false;
     m_error.clear();
     if (!m_doc.Attr().GetPolc(settings.pushover, m_polc)) {
-        m_error = "no such pushover load case";
+        m_error = MMSGFunction::GetValue("IDS_QM_CURVE_NO_CASE");
         return 0;
     }
+    if (IsControlNodeFound() && !FindControlNode()) return 0;
     if (m_polc.direction == kDirectionZ) m_plotType = PLOT_TYPE::LoadFactor;
     if (m_polc.patternKind == kUniformAcceleration && IsTargetType(m_plotType))
         m_factors.eigenBased = false;
     T_NODE_D node;
     if (!m_doc.Attr().GetNode(m_polc.controlNode, node)) {
-        m_error = "the control node is not in the model";
+        m_error = MMSGFunction::GetValue("IDS_QM_CURVE_NO_NODE");
         return 0;
     }
     m_controlHeight = std::fabs(node.xyz[2]);
@@ -70,6 +74,16 @@ int CPushOverCurveData::BeforePreparePOCurveData(const T_PUSH_CURVE_SETTINGS& se
     m_factors.weight = m_mass[2] * settings.gravity;
     if (m_factors.weight == 0.0) m_factors.weight = settings.userWeight;
     return 1;
+}
+
+int CPushOverCurveData::FindControlNode()
+{
+    CPostCtrl& post = m_doc.Post();
+    if (post.SelectPushover(m_settings.pushover) && post.FindControlNode(m_polc.controlNode))
+        return 1;
+    m_error =
+        post.Error().empty() ? MMSGFunction::GetValue("IDS_QM_CURVE_NO_RESULTS") : post.Error();
+    return 0;
 }
 
 // The mode with the largest participation in the control direction, or the one that the load
@@ -213,13 +227,14 @@ int CPushOverCurveData::PreparePOCurveData()
     m_extra.fill({0.0});
     CPostCtrl& post = m_doc.Post();
     if (!post.SelectPushover(m_settings.pushover)) {
-        m_error = "the pushover load case has no results";
+        m_error = MMSGFunction::GetValue("IDS_QM_CURVE_NO_RESULTS");
         return 0;
     }
     const int steps = post.GetStepCount();
     for (int i = 1; i <= steps; ++i) {
         if (AppendStep(i)) continue;
-        m_error = post.Error().empty() ? "the control node has no results" : post.Error();
+        m_error = post.Error().empty() ? MMSGFunction::GetValue("IDS_QM_CURVE_NO_NODE_RESULTS")
+                                       : post.Error();
         return 0;
     }
     return 1;

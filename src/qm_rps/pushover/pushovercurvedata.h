@@ -41,6 +41,9 @@ struct T_PUSH_CURVE_SETTINGS {
     bool operator==(const T_PUSH_CURVE_SETTINGS&) const = default;
 };
 
+/// Control option of a load case that names its control node.
+inline constexpr int kNamedControlNode = 1;
+
 /// Factors between the multi- and the single-degree-of-freedom system.
 struct T_PUSH_FACTORS {
     double gamma = 0.0;   // Gamma-phi: control displacement / Sd
@@ -75,6 +78,9 @@ public:
     /// The plot type used: a vertical push allows the load factor alone.
     PLOT_TYPE PlotType() const { return m_plotType; }
 
+    /// Whether the control node is the one that has moved most at the last step.
+    bool IsControlNodeFound() const { return m_polc.controlOption != kNamedControlNode; }
+
     bool NoEigen() const { return m_noEigen; }                 // the model has no eigen modes
     bool EigenError() const { return m_eigenError; }           // the mode does not move that way
     bool ConversionError() const { return m_conversionError; } // Gamma or the force scale is 0
@@ -93,6 +99,7 @@ public:
 
 private:
     int BeforePreparePOCurveData(const T_PUSH_CURVE_SETTINGS& settings);
+    int FindControlNode();
     void CalcEigenMode();
     void CalcMassFactors(double control);
     void CheckStoreyMasses();

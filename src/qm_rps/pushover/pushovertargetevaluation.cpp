@@ -77,7 +77,7 @@ int CPushOverTargetEvaluation::FitEc8(const T_CURVE_PLACE& dm)
 {
     m_bilinear.reset();
     T_BILINEAR b;
-    if (!CalcBilinearEc8(m_fromOrigin.View(), dm, b)) return 0;
+    if (!CalcBilinearEc8(m_fromOrigin.View(), dm, m_in.options.peak, b)) return 0;
     m_bilinear = b;
     ++m_fits;
     return 1;

@@ -15,6 +15,8 @@ struct T_FIT {
 
 constexpr T_BILINEAR_OPTIONS kEc8{BILINEAR_RULE::Ec8, 0.6, 0.85, false};
 constexpr T_BILINEAR_OPTIONS kNtc{BILINEAR_RULE::Ntc, 0.6, 0.85, false};
+constexpr T_BILINEAR_OPTIONS kEc8Peak{BILINEAR_RULE::Ec8, 0.6, 0.85, false, true};
+constexpr T_BILINEAR_OPTIONS kNtcPeak{BILINEAR_RULE::Ntc, 0.6, 0.85, false, true};
 constexpr T_BILINEAR_OPTIONS kSecant8{BILINEAR_RULE::Ntc, 0.8, 0.85, false};
 constexpr T_BILINEAR_OPTIONS kMasonry{BILINEAR_RULE::Masonry, 0.7, 0.8, false};
 
@@ -24,9 +26,9 @@ const T_ADRS_CURVE kSoft{{0, 0.01, 0.02, 0.04, 0.05, 0.06}, {0, 0.2, 0.2, 0.1, 0
 const T_ADRS_CURVE kBack{{0, 0.02, 0.1, 0.06, 0.14}, {0, 40, 50, 20, 22}}; // steps back
 const T_ADRS_CURVE kKnuckle{{0, 0.1, 1.0, 1.1}, {0, 0.5, 0.6, 1.0}};
 
-int Ec8(const T_ADRS_CURVE& curve, double dm, T_BILINEAR& out)
+int Ec8(const T_ADRS_CURVE& curve, double dm, T_BILINEAR& out, bool peak = false)
 {
-    return CalcBilinearEc8(curve.View(), FirstPlaceAt(curve.View(), dm), out);
+    return CalcBilinearEc8(curve.View(), FirstPlaceAt(curve.View(), dm), peak, out);
 }
 
 /// Yield point of the ntc rule from stiffness, ultimate displacement and area done by hand.
@@ -63,6 +65,10 @@ const T_FIT kFits[] = {
     // Falls to 42.5 at 0.09, stepping back; area 4 - 0.01 (50 + 42.5)/2; 30 at 0.015.
     { "ntc, steps back",           kBack, kNtc, 0.0, Ntc(2000, 0.09, 3.5375) },
     { "masonry, steps back",       kBack, kMasonry, 0.0, Ntc(2000, 0.26 / 3, 3.4) }, // 40; 35
+    // At 0.04 the force has fallen to 0.1: area to there 0.001 + 0.002 + 0.003, peak 0.2.
+    { "ec8, largest force",        kSoft, kEc8Peak, 0.04, {0.02, 0.2, 0.06, 0.2} },
+    // The peak on the secant of k = 20.
+    { "ntc, largest force",        kTrilinear, kNtcPeak, 0.0, {0.015, 0.3, 0.05, 0.3} },
     // k = 0.6, area 0.025 + 0.495 + 0.08 = 0.6 > k du2/2: no real root, the peak is taken.
     { "ntc, no root",              kKnuckle, kNtc, 0.0, {1.0 / 0.6, 1.0, 1.1, 1.0} },
 };
@@ -75,7 +81,8 @@ TEST(Bilinear, FitsByHand)
     for (const T_FIT& f : kFits) {
         T_BILINEAR b;
         const bool ec8 = f.options.rule == BILINEAR_RULE::Ec8;
-        ASSERT_EQ(1, ec8 ? Ec8(f.curve, f.dm, b) : CalcBilinearNtc(f.curve.View(), f.options, b))
+        ASSERT_EQ(1, ec8 ? Ec8(f.curve, f.dm, b, f.options.peak)
+                         : CalcBilinearNtc(f.curve.View(), f.options, b))
             << f.label;
         EXPECT_NEAR(f.expected.dy, b.dy, 1e-14) << f.label;
         EXPECT_NEAR(f.expected.ay, b.ay, 1e-13 * std::max(1.0, b.ay)) << f.label;

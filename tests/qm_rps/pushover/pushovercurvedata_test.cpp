@@ -166,6 +166,21 @@ TEST_F(CurveData, ExtraNodesKeepTheirZeroAndRaiseTheLargestDisplacement)
     EXPECT_DOUBLE_EQ(0.7 / kGamma, m_curve.MaxDisplacement());
 }
 
+// Node 1 goes back to 0.7 at the last step, after 3 has led.
+TEST_F(CurveData, AnotherControlOptionTakesTheNodeThatHasMovedMostAtTheEnd)
+{
+    T_PUSH_DATA data;
+    data.loadFactor = data.baseReaction = {1, 2};
+    data.displacement = {{2, {0.9, 0.1}}, {3, {0.5, 0.6}}, {1, {0.1, -0.7}}};
+    m_content.results[1] = MakePushResult(data);
+    for (const int option : {1, 2}) {
+        m_push.controlOption = option;
+        ASSERT_EQ(1, Calc(Settings(P::BaseReaction)));
+        EXPECT_EQ(option == 1 ? 3 : 1, m_curve.LoadCase().controlNode);
+        EXPECT_DOUBLE_EQ(option == 1 ? 0.6 : 0.7, m_curve.Displacement().back());
+    }
+}
+
 TEST_F(CurveData, WeightAndHeightHaveTheirFallBacks)
 {
     for (auto& entry : m_content.model.nodes)

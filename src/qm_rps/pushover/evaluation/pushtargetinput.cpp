@@ -15,6 +15,7 @@ T_BILINEAR_OPTIONS BilinearOptionsOf(const T_EVAL_D& evaluation)
     options.drop = given.drop.value_or(options.drop);
     // The iteration runs on one spectrum; NTC has four.
     options.iterate = ec8 && given.iterate.value_or(false);
+    options.peak = given.strength == "peak";
     return options;
 }
 
