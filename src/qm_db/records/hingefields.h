@@ -314,6 +314,8 @@ void CaseFields(V& v, T_FIELD_REF<V, T_PHGE_D> r)
     v.KeyRef("hinge_type", r.hingeType, KindOf<T_PHGT_D>());
     v.Part("crack", r.crack);
     v.Part("yield", r.yield);
+    v.Part("crack_J", r.crackJ);
+    v.Part("yield_J", r.yieldJ);
 }
 
 template <class V>

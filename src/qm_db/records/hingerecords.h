@@ -214,6 +214,8 @@ struct T_PHGE_D {
     int element = 0;
     int hingeType = 0;                               // key
     std::array<T_SIDES<double>, 6> crack{}, yield{}; // strengths by component
+    /// Those of the J-end of components whose ends have curves of their own; else 0.
+    std::array<T_SIDES<double>, 6> crackJ{}, yieldJ{};
     bool operator==(const T_PHGE_D&) const = default;
 };
 

@@ -164,6 +164,8 @@ constexpr T_MEMBER_PLACE kMemberPlaces[] = {
     {"hinges", "hinge_type", MEMBER_PLACE::Packed, "refs"},
     {"hinges", "crack", MEMBER_PLACE::Packed, "crack"},
     {"hinges", "yield", MEMBER_PLACE::Packed, "yield"},
+    {"hinges", "crack_J", MEMBER_PLACE::Packed, "crack_J"},
+    {"hinges", "yield_J", MEMBER_PLACE::Packed, "yield_J"},
     {"increment_functions", "step", MEMBER_PLACE::List, "step"},
     {"increment_functions", "factor", MEMBER_PLACE::List, "factor"},
     {"spectra", "SLO", MEMBER_PLACE::Part, "SLO"},

@@ -48,6 +48,8 @@ void PackedLists(V& v, auto& key, H& h)
     v.List("refs", LIST::Always, key, h.element, h.hingeType);
     v.List("crack", LIST::Always, h.crack);
     v.List("yield", LIST::Always, h.yield);
+    v.List("crack_J", LIST::UnlessZero, h.crackJ);
+    v.List("yield_J", LIST::UnlessZero, h.yieldJ);
 }
 
 // ---- writing and reading them -------------------------------------------------------------------
