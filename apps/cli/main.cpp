@@ -9,6 +9,7 @@
 
 #include <csignal>
 #include <cstdio>
+#include <span>
 #include <string_view>
 
 namespace {
@@ -61,7 +62,10 @@ int main(int argc, char** argv)
                 .empty();
         const std::string what = unknown ? Say("IDS_QM_CLI_UNKNOWN_COMMAND", std::string(argv[1]))
                                          : ParserWords(e.what());
-        return ToInt(Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_SEE_HELP", what)));
+        const std::string meant =
+            MeantWord(app, std::span<const char* const>(argv + 1, argv + argc));
+        const std::string words = meant.empty() ? what : Say("IDS_QM_CLI_MEANT", what, meant);
+        return ToInt(Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_SEE_HELP", words)));
     }
     if (!CConsole::Flush()) {
         return ToInt(Complain(EXIT_CODE::NoAccess, Say("IDS_QM_CLI_NO_STDOUT")));

@@ -1,9 +1,11 @@
 // The help in the user's language: what the argument parser itself says, and its labels.
 #include "qm_base/messagetext.h"
 #include "qm_rps/pushover/report/pushoverreport.h"
+#include "qm_base/nearname.h"
 #include "registershared.h"
 #include "registrations.h"
 
+#include <algorithm>
 #include <optional>
 #include <string_view>
 #include <vector>
@@ -57,7 +59,61 @@ std::optional<std::vector<std::string>> PlacesIn(std::string_view text, std::str
     return words == text ? std::optional(args) : std::nullopt;
 }
 
+/// Commands that stand below this one.
+std::vector<const CLI::App*> CommandsOf(const CLI::App& app)
+{
+    return app.get_subcommands([](const CLI::App*) { return true; });
+}
+
+/// The option of a command of that name ("--out", "-o"), or null.
+const CLI::Option* OptionOf(const CLI::App& app, std::string_view name)
+{
+    const std::string plain(name.substr(0, name.find('=')));
+    for (const CLI::Option* option : app.get_options())
+        if (option->check_name(plain)) return option;
+    return nullptr;
+}
+
+std::string NearCommand(const CLI::App& app, std::string_view word)
+{
+    std::vector<std::string_view> names;
+    for (const CLI::App* sub : CommandsOf(app))
+        names.push_back(sub->get_name());
+    return NearestName(word, names);
+}
+
+std::string NearOption(const CLI::App& app, std::string_view word)
+{
+    std::vector<std::string> names;
+    for (const CLI::Option* option : app.get_options())
+        for (const std::string& name : option->get_lnames())
+            names.push_back("--" + name);
+    const std::vector<std::string_view> views(names.begin(), names.end());
+    return NearestName(word.substr(0, word.find('=')), views);
+}
+
 } // namespace
+
+std::string MeantWord(const CLI::App& program, std::span<const char* const> words)
+{
+    const CLI::App* app = &program;
+    for (std::size_t i = 0; i < words.size(); ++i) {
+        const std::string_view word = words[i];
+        if (word.starts_with("-")) {
+            const CLI::Option* option = OptionOf(*app, word);
+            if (!option) return word.starts_with("--") ? NearOption(*app, word) : std::string();
+            const bool takesNext = option->get_expected_min() > 0 && word.find('=') == word.npos;
+            if (takesNext) i += static_cast<std::size_t>(option->get_expected_min());
+            continue;
+        }
+        const auto commands = CommandsOf(*app);
+        if (commands.empty()) continue; // a file
+        const auto at = std::ranges::find(commands, word, &CLI::App::get_name);
+        if (at == commands.end()) return NearCommand(*app, word);
+        app = *at;
+    }
+    return {};
+}
 
 std::string ParserWords(const std::string& what)
 {

@@ -1,5 +1,6 @@
 #include "qm_db/casefile/jsonreader.h"
 
+#include "qm_base/nearname.h"
 #include "qm_base/textformat.h"
 #include "qm_db/records/inputlimits.h"
 
@@ -30,6 +31,21 @@ std::string Joined(std::span<const char* const> names)
     for (const char* name : names)
         all += (all.empty() ? "" : ", ") + std::string(name);
     return all;
+}
+
+/// The key with the known one that was meant; where none is near, with a short list of them.
+std::string UnknownKey(const std::string& key, std::span<const std::string_view> known)
+{
+    constexpr std::size_t kShortList = 12;
+    const std::string meant = NearestName(key, known);
+    if (!meant.empty())
+        return Say("IDS_QM_JSON_UNKNOWN_KEY_NEAR", QuotedText(key), QuotedText(meant));
+    std::string all;
+    for (const std::string_view name : known)
+        all += (all.empty() ? "" : ", ") + std::string(name);
+    if (known.empty() || known.size() > kShortList)
+        return Say("IDS_QM_JSON_UNKNOWN_KEY", QuotedText(key));
+    return Say("IDS_QM_JSON_UNKNOWN_KEY_KNOWN", QuotedText(key), all);
 }
 
 } // namespace
@@ -77,7 +93,7 @@ void CJsonReader::Keys(std::span<const std::string_view> known)
     if (!members) return FailType(kObject);
     for (const T_JSON_MEMBER& member : *members) {
         if (std::find(known.begin(), known.end(), member.key) == known.end())
-            return Fail("IDS_QM_JSON_UNKNOWN_KEY", QuotedText(member.key));
+            return FailWith(UnknownKey(member.key, known));
     }
 }
 
