@@ -38,27 +38,35 @@ void PrintDetail(const std::string& text)
     std::printf("      %s\n", text.c_str());
 }
 
-void PrintSide(const char* name, const T_SKEL_SIDE& s)
+/// A strength, unless it is calculated for each element.
+std::string StrengthText(double strength, bool automatic)
 {
-    PrintDetail(Say("IDS_QM_CLI_HINGE_SIDE", name, ShortestText(s.yield),
+    return automatic ? Say("IDS_QM_CLI_HINGE_AUTOMATIC") : ShortestText(strength);
+}
+
+void PrintSide(const char* name, const T_SKEL_SIDE& s, bool automatic, SKEL_TYPE)
+{
+    PrintDetail(Say("IDS_QM_CLI_HINGE_SIDE", name, StrengthText(s.yield, automatic),
                     ShortestText(s.yieldDeform), Text(s.B), Text(s.C), Text(s.D), Text(s.E),
                     ShortestText(s.IO), ShortestText(s.LS), ShortestText(s.CP)));
 }
 
-void PrintSide(const char* name, const T_SKEL_MULTI_SIDE& s)
+void PrintSide(const char* name, const T_SKEL_MULTI_SIDE& s, bool automatic, SKEL_TYPE type)
 {
-    PrintDetail(Say("IDS_QM_CLI_HINGE_MULTI_SIDE", name, ShortestText(s.P1), ShortestText(s.P2),
-                    ShortestText(s.P3), ShortestText(s.D1), ShortestText(s.D2), ShortestText(s.D3),
-                    ShortestText(s.alpha1), ShortestText(s.alpha2), ShortestText(s.gap)));
+    const bool tri = IsTrilinear(type);
+    PrintDetail(Say("IDS_QM_CLI_HINGE_MULTI_SIDE", name, StrengthText(s.P1, automatic && !tri),
+                    StrengthText(s.P2, automatic && tri), ShortestText(s.P3), ShortestText(s.D1),
+                    ShortestText(s.D2), ShortestText(s.D3), ShortestText(s.alpha1),
+                    ShortestText(s.alpha2), ShortestText(s.gap)));
 }
 
-void PrintCurve(HINGE_END end, const T_SKEL_CURVE& curve)
+void PrintCurve(HINGE_END end, const T_SKEL_CURVE& curve, SKEL_TYPE type)
 {
     std::printf("    %s:\n", EndName(end).c_str());
     std::visit(
-        [](const auto& c) {
-            PrintSide("(+)", c.sides.pos);
-            PrintSide("(-)", c.sides.neg);
+        [&](const auto& c) {
+            PrintSide("(+)", c.sides.pos, c.autoYield, type);
+            PrintSide("(-)", c.sides.neg, c.autoYield, type);
         },
         curve);
     const auto* fema = std::get_if<T_SKEL_FEMA>(&curve);
@@ -100,7 +108,9 @@ EXIT_CODE RunHingeShow(const T_HINGE_OPTIONS& o)
             if (!component.active) continue;
             std::printf("  %s: %s\n", kComponentNames[c],
                         Say(kCurveTypes[static_cast<std::size_t>(component.type)]).c_str());
-            ForEachPage(component, PrintCurve);
+            ForEachPage(component, [&](HINGE_END end, const T_SKEL_CURVE& curve) {
+                PrintCurve(end, curve, component.type);
+            });
         }
     });
 }

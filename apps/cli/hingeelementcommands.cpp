@@ -4,65 +4,76 @@
 #include "qm_base/textformat.h"
 #include "qm_rps/desk/elementlist.h"
 #include "qm_rps/hinge/hingegenerator.h"
-#include "qm_rps/hinge/hingetheta.h"
+#include "qm_rps/hinge/hingetypefindings.h"
+#include "qm_rps/hinge/pageyield.h"
 #include "qm_rps/pushoverhingelistdlg.h"
 
 #include <algorithm>
 
 namespace {
 
-/// One side at one end: strength and deformation at first yield, "-" where there is no method.
-/// False when an automatic strength could not be calculated.
-template <class CURVE, class SIDE>
-bool PrintYieldSide(const T_HINGE_ELEMENT& in, std::size_t c, SKEL_TYPE type, HINGE_LOCATION end,
-                    const CURVE& curve, const SIDE& side, bool positive)
+/// "yield rotation 0.0074 rad", "yield curvature 0.0012 1/m", "yield deformation -".
+std::string DeformText(const T_PHGT_D& type, HINGE_COMPONENT c, std::optional<double> deform,
+                       const T_UNITS& units)
 {
-    const auto& automatic = in.result->strength.yield[c]; // empty where there is a fault
-    std::optional<double> yield;
-    if (!curve.autoYield)
-        yield = CHingeGenerator::EnteredYield(side, type);
-    else if (automatic)
-        yield = positive ? automatic->pos : automatic->neg;
-    const auto k = static_cast<HINGE_COMPONENT>(c);
-    const T_THETA_LOOKUP lookup{&in.section, &in.material, in.memberLength};
-    double deform = 0.0;
-    if (yield)
-        deform = IsMoment(k) ? CHingeTheta::CalcThetaMoment(lookup, k, end, curve.initStiffness,
-                                                            side.userStiffness, *yield)
-                             : CHingeTheta::CalcThetaShear(lookup, k, end, curve.initStiffness,
-                                                           side.userStiffness, *yield);
-    PrintLine("  " +
-              Say("IDS_QM_CLI_HINGE_YIELD", kComponentNames[c], positive ? "+" : "-",
-                  EndName(end == HINGE_LOCATION::IEnd ? HINGE_END::I : HINGE_END::J),
-                  yield ? FormatText("%.9g", *yield) : "-",
-                  Say(curve.autoYield ? "IDS_QM_CLI_HINGE_AUTOMATIC" : "IDS_QM_CLI_HINGE_ENTERED"),
-                  deform != 0.0 ? FormatText("%.9g", deform) : "-"));
-    return yield.has_value();
+    const std::string value = deform ? FormatText("%.9g", *deform) : "-";
+    if (!IsMoment(c)) return Say("IDS_QM_CLI_HINGE_DEFORM", value);
+    const bool rotation = type.definition == HINGE_DEFINITION::MomentRotation;
+    const std::string unit = rotation ? "rad" : "1/" + std::string(NameOf(units.length));
+    return Say(rotation ? "IDS_QM_CLI_HINGE_ROTATION" : "IDS_QM_CLI_HINGE_CURVATURE",
+               deform ? value + " " + unit : value);
 }
 
-/// Both ends, or the one where the hinge is, and both sides of one component.
-bool PrintYieldComponent(const T_HINGE_ELEMENT& in, std::size_t c,
-                         const T_HINGE_COMPONENT& component)
+/// What the command prints the values of.
+struct T_YIELD_OF {
+    const T_PHGT_D& type;
+    const T_HINGE_ELEMENT& in;
+    T_UNITS units;
+};
+
+/// One curve at one end: strengths and deformations at first yield of both sides, "-" where there
+/// is no method. False when an automatic strength could not be calculated.
+bool PrintYieldCurve(const T_YIELD_OF& of, std::size_t i, HINGE_LOCATION end,
+                     const T_SKEL_CURVE& curve)
 {
+    const auto c = static_cast<HINGE_COMPONENT>(i);
+    const T_THETA_LOOKUP lookup =
+        LookupOf(of.type, of.in.section ? &*of.in.section : nullptr,
+                 of.in.material ? &*of.in.material : nullptr, of.in.memberLength);
+    const T_SIDE_VALUES yield =
+        PageStrength(curve, of.type.components[i].type, c, *of.in.result).yield;
+    const T_SIDE_VALUES deform = PageDeform(curve, c, end, lookup, yield);
+    const auto* fema = std::get_if<T_SKEL_FEMA>(&curve);
+    const char* source = IsAutoYield(curve)         ? "IDS_QM_CLI_HINGE_AUTOMATIC"
+                         : fema && fema->multiCurve ? "IDS_QM_CLI_HINGE_ENTERED_AXIAL"
+                                                    : "IDS_QM_CLI_HINGE_ENTERED";
+    for (const bool positive : {true, false}) {
+        const std::optional<double> strength = positive ? yield.pos : yield.neg;
+        PrintLine("  " + Say("IDS_QM_CLI_HINGE_YIELD", kComponentNames[i], positive ? "+" : "-",
+                             EndName(end == HINGE_LOCATION::IEnd ? HINGE_END::I : HINGE_END::J),
+                             strength ? FormatText("%.9g", *strength) : "-", Say(source),
+                             DeformText(of.type, c, positive ? deform.pos : deform.neg, of.units)));
+    }
+    return yield.pos.has_value();
+}
+
+/// Both ends, or the one where the hinge is.
+bool PrintYieldComponent(const T_YIELD_OF& of, std::size_t i)
+{
+    const T_HINGE_COMPONENT& component = of.type.components[i];
     bool whole = true;
     for (const HINGE_LOCATION end : {HINGE_LOCATION::IEnd, HINGE_LOCATION::JEnd}) {
-        const HINGE_LOCATION other =
-            end == HINGE_LOCATION::IEnd ? HINGE_LOCATION::JEnd : HINGE_LOCATION::IEnd;
-        if (component.location == other) continue;
-        const bool j = end == HINGE_LOCATION::JEnd && !component.sameEnds;
-        std::visit(
-            [&](const auto& curve) {
-                const auto& neg = curve.symmetric ? curve.sides.pos : curve.sides.neg;
-                whole &= PrintYieldSide(in, c, component.type, end, curve, curve.sides.pos, true);
-                whole &= PrintYieldSide(in, c, component.type, end, curve, neg, false);
-            },
-            j ? component.curves.J : component.curves.I);
+        const bool j = end == HINGE_LOCATION::JEnd;
+        if (component.location == (j ? HINGE_LOCATION::IEnd : HINGE_LOCATION::JEnd)) continue;
+        const bool own = j && !component.sameEnds;
+        whole &= PrintYieldCurve(of, i, end, own ? component.curves.J : component.curves.I);
     }
     return whole;
 }
 
 /// Yield strengths and deformations of a hinge on one element. False when something is missing.
-bool PrintYield(const CHingeGenerator& generator, const T_PHGE_D& hinge, const T_PHGT_D& type)
+bool PrintYield(const CHingeGenerator& generator, const T_PHGE_D& hinge, const T_PHGT_D& type,
+                const T_UNITS& units)
 {
     T_HINGE_ELEMENT in;
     T_HINGE_REFUSAL refusal;
@@ -71,11 +82,13 @@ bool PrintYield(const CHingeGenerator& generator, const T_PHGE_D& hinge, const T
         return false;
     }
     PrintLine(Say("IDS_QM_CLI_HINGE_ON_ELEMENT", std::to_string(hinge.element), type.name,
-                  in.section.name, in.material.name, FormatText("%.6g", in.memberLength)));
+                  in.section ? in.section->name : "-", in.material ? in.material->name : "-",
+                  in.section ? FormatText("%.6g", in.memberLength) : "-"));
+    if (!type.length.autoSpan)
+        PrintLine("  " + Say("IDS_QM_CLI_HINGE_OWN_SPAN", FormatText("%.6g", type.length.span)));
     bool whole = true;
-    for (std::size_t c = 0; c < type.components.size(); ++c) {
-        if (type.components[c].active) whole &= PrintYieldComponent(in, c, type.components[c]);
-    }
+    for (std::size_t i = 0; i < type.components.size(); ++i)
+        if (type.components[i].active) whole &= PrintYieldComponent({type, in, units}, i);
     if (!whole && in.result->fault != SECT_FAULT::None)
         PrintLine("  " + Say(MessageKeyOf(in.result->fault)));
     return whole;
@@ -108,7 +121,7 @@ void PrintHinges(const CPushOverHingeListDlg& list, bool crack, const T_UNITS& u
         cells = {std::to_string(row.key), std::to_string(row.element), row.type};
         for (const T_SIDES<double>& s : row.strengths)
             for (const double v : {s.pos, s.neg}) {
-                cells.push_back(FormatText("%.9g", v));
+                cells.push_back(v == 0.0 ? "-" : FormatText("%.9g", v));
                 any = any || v != 0.0;
             }
     }
@@ -120,6 +133,18 @@ void PrintHinges(const CPushOverHingeListDlg& list, bool crack, const T_UNITS& u
                 std::string(NameOf(units.force)).c_str(),
                 std::string(NameOf(units.length)).c_str());
     PrintTable(table);
+}
+
+/// Hinges whose strengths are not those of today, once each.
+void PrintStale(const CPushOverHingeListDlg& list)
+{
+    int last = 0;
+    for (const CPushOverHingeListDlg::T_ROW& row : list.Rows(false)) {
+        if (row.key != last && !row.stale.empty())
+            PrintLine(Say("IDS_QM_CLI_HINGE_STALE", std::to_string(row.key),
+                          Say("IDS_QM_HINGE_STALE", row.stale)));
+        last = row.key;
+    }
 }
 
 } // namespace
@@ -137,7 +162,7 @@ EXIT_CODE RunHingeYield(const T_HINGE_OPTIONS& o)
         T_PHGT_D type;
         if (doc.Attr().GetPhge(entry.first, hinge) && doc.Attr().GetPhgt(hinge.hingeType, type) &&
             (o.type.empty() || o.type == type.name))
-            whole &= PrintYield(generator, hinge, type);
+            whole &= PrintYield(generator, hinge, type, doc.Unit().Units());
     }
     return whole ? EXIT_CODE::Done : EXIT_CODE::NotFound;
 }
@@ -170,6 +195,7 @@ EXIT_CODE RunHingeGenerated(const T_HINGE_OPTIONS& o)
     if (count > 0) {
         PrintHinges(list, false, doc.Unit().Units());
         PrintHinges(list, true, doc.Unit().Units());
+        PrintStale(list);
     }
     PrintLine(Say("IDS_QM_CLI_HINGE_GENERATED", std::to_string(count)));
     return EXIT_CODE::Done;

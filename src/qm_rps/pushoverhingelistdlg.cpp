@@ -8,6 +8,35 @@
 
 using zql::lib::MMSGFunction;
 
+namespace {
+
+using T_STRENGTHS = std::array<T_SIDES<double>, 6>;
+constexpr std::array<const char*, 2> kEndKeys{"IDS_RPS_PO_LOCATION_I_end",
+                                              "IDS_RPS_PO_LOCATION_J_end"};
+
+bool HasOwnEnd(const T_PHGE_D& hinge)
+{
+    return hinge.yieldJ != T_STRENGTHS{} || hinge.crackJ != T_STRENGTHS{};
+}
+
+/// Strengths at one end; 0 where the component has its hinge at the other one.
+T_STRENGTHS StrengthsAt(const T_PHGT_D& type, const T_PHGE_D& hinge, HINGE_LOCATION end, bool crack)
+{
+    const bool j = end == HINGE_LOCATION::JEnd;
+    const HINGE_LOCATION other = j ? HINGE_LOCATION::IEnd : HINGE_LOCATION::JEnd;
+    T_STRENGTHS out{};
+    for (std::size_t i = 0; i < out.size(); ++i) {
+        const T_HINGE_COMPONENT& c = type.components[i];
+        if (c.location == other) continue;
+        const bool own = j && NeedsIJPages(c);
+        out[i] =
+            crack ? (own ? hinge.crackJ : hinge.crack)[i] : (own ? hinge.yieldJ : hinge.yield)[i];
+    }
+    return out;
+}
+
+} // namespace
+
 std::string CPushOverHingeListDlg::InteractionText(int code)
 {
     switch (code) {
@@ -62,13 +91,26 @@ std::vector<std::string> CPushOverHingeListDlg::Heads()
 std::vector<CPushOverHingeListDlg::T_ROW> CPushOverHingeListDlg::Rows(bool crack) const
 {
     std::vector<T_ROW> rows;
+    const CHingeGenerator generator(m_doc);
     const T_TABLE<T_PHGT_D> types = HingeTypesOf(m_doc);
     for (const auto& [key, hinge] : HingesOf(m_doc)) {
         const auto type = types.find(hinge.hingeType);
-        const std::string name =
-            type == types.end() ? MMSGFunction::GetValue("IDS_PUSHOVER_Error") : type->second.name;
-        rows.push_back({key, hinge.element, CPO_HingeTypeListDlg::NameOf(hinge.hingeType, name),
-                        crack ? hinge.crack : hinge.yield});
+        const bool gone = type == types.end();
+        const std::string name = CPO_HingeTypeListDlg::NameOf(
+            hinge.hingeType,
+            gone ? MMSGFunction::GetValue("IDS_PUSHOVER_Error") : type->second.name);
+        T_ROW row{key, hinge.element, name, crack ? hinge.crack : hinge.yield,
+                  generator.StaleText(hinge)};
+        if (gone || !HasOwnEnd(hinge)) {
+            rows.push_back(row);
+            continue;
+        }
+        for (const HINGE_LOCATION end : {HINGE_LOCATION::IEnd, HINGE_LOCATION::JEnd}) {
+            const bool j = end == HINGE_LOCATION::JEnd;
+            row.type = name + ", " + MMSGFunction::GetValue(kEndKeys[j ? 1 : 0]);
+            row.strengths = StrengthsAt(type->second, hinge, end, crack);
+            rows.push_back(row);
+        }
     }
     return rows;
 }

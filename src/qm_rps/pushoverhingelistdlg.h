@@ -23,13 +23,15 @@ public:
     /// A row of the list: strengths of one kind per component and sign.
     struct T_ROW {
         int key = 0, element = 0;
-        std::string type; // "2 : column"; an error text where it is gone
-        std::array<T_SIDES<double>, 6> strengths{};
+        std::string type; // "2 : column", "2 : column, J-end"; an error text where it is gone
+        std::array<T_SIDES<double>, 6> strengths{}; // 0: the end has no such hinge, or no strength
+        std::string stale; // strengths that are not those of today; empty: all are
         bool operator==(const T_ROW&) const = default;
     };
     /// Heads of the columns of strengths: "Fx(+)", "Fx(-)" ... "Mz(-)".
     static std::vector<std::string> Heads();
-    /// The hinges by key with their crack or yield strengths.
+    /// The hinges by key with their crack or yield strengths; two rows for a hinge whose ends have
+    /// strengths of their own.
     std::vector<T_ROW> Rows(bool crack) const;
 
     CDBDoc& Doc() const { return m_doc; }

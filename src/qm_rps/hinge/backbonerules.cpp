@@ -103,6 +103,34 @@ constexpr T_HINGE_RULE<S> kEnergy[] = {
      [](const S& s) { return NotAbove(0, s.values.energy[3]); }},
 };
 
+constexpr double kUsualTol = 1e-9; // of values that are 0 or 1
+bool IsAbout(double v, double wanted)
+{
+    return std::fabs(v - wanted) <= kUsualTol;
+}
+bool Plastic(const S& s)
+{
+    return !s.ratios;
+}
+constexpr const char* kPointB = "IDS_QM_HINGE_POINT_B";
+constexpr T_HINGE_RULE<S> kUsualB[] = {
+    {{.message = kPointB, .text = "D(B) = 1", .field = "sides.pos.B.deform", .point = "B"},
+     [](const S& s) { return IsAbout(s.values.B.deform, 1.0); },
+     Ratios},
+    {{.message = kPointB, .text = "D(B) = 0", .field = "sides.pos.B.deform", .point = "B"},
+     [](const S& s) { return IsAbout(s.values.B.deform, 0.0); },
+     Plastic},
+    {{.message = kPointB, .text = "F(B) = 1", .field = "sides.pos.B.strength", .point = "B"},
+     [](const S& s) { return IsAbout(s.values.B.strength, 1.0); }},
+};
+constexpr T_HINGE_RULE<S> kUsualCP[] = {
+    {{.message = "IDS_QM_HINGE_CP_BEYOND_E",
+      .text = "CP <= D(E)",
+      .field = "sides.pos.CP",
+      .point = "CP"},
+     [](const S& s) { return NotAbove(s.values.CP, s.values.E.deform); }},
+};
+
 S Positive(const T_BACKBONE& b)
 {
     return {b.pos, HINGE_SIDE::Positive, b.strengthLoss, b.ratios};
@@ -176,6 +204,12 @@ void CheckEnergyFactors(const T_BACKBONE& b, const T_HINGE_PLACE& place, T_FINDI
     WalkRulesBySide(kElasticEnergy, sides, place, out);
     for (const S& side : sides)
         WalkRules(kEnergy, side, place.On(side.side), out);
+}
+
+void CheckUsualPoints(const T_BACKBONE& b, const T_HINGE_PLACE& place, T_FINDINGS& out)
+{
+    WalkRulesBySide(kUsualB, SidesOf(b), place, out);
+    if (b.criteria) WalkRulesBySide(kUsualCP, SidesOf(b), place, out);
 }
 
 void MirrorSide(const T_SKEL_SIDE& pos, T_SKEL_SIDE& neg)

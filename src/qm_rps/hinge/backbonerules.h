@@ -38,6 +38,7 @@ BACKBONE_CHECK CheckFromOrigin; // of the diagram that shows A
 BACKBONE_CHECK CheckAcceptance;
 BACKBONE_CHECK CheckYieldStrengths;
 BACKBONE_CHECK CheckEnergyFactors;
+BACKBONE_CHECK CheckUsualPoints; // no refusal: B at the yield point, CP not beyond E
 
 /// The side that mirrors `pos`. Energy factors and user stiffness have entries of their own on
 /// each side, so they stay as they are in `neg`.

@@ -167,3 +167,14 @@ std::vector<T_FINDING> DiagramFindings(const T_SKEL_FEMA& curve, HINGE_COMPONENT
     CheckUnder("IDS_PUSHOVER_Wrong_Data_in_Acceptance_Criteria_", CheckAcceptance, b, place, out);
     return out;
 }
+
+void PointWarnings(const T_SKEL_CURVE& curve, const T_HINGE_PLACE& place, T_FINDINGS& out)
+{
+    if (const auto* e = std::get_if<T_SKEL_EC8>(&curve))
+        CheckUsualPoints(CheckedSides(*e, e->sides), place, out);
+    const auto* f = std::get_if<T_SKEL_FEMA>(&curve);
+    if (!f || (f->infillStrut && f->infillGeneral)) return;
+    ForEachForce(*f, place, [&](const T_SIDES<T_SKEL_SIDE>& sides, const T_HINGE_PLACE& at) {
+        CheckUsualPoints(CheckedSides(*f, sides), at, out);
+    });
+}

@@ -103,6 +103,12 @@ inline bool IsSlip(SKEL_TYPE type)
     return type == SKEL_TYPE::SlipBilinear || type == SKEL_TYPE::SlipTrilinear;
 }
 
+/// The type is for elements with a section; links and point springs have none.
+inline bool HasLineElement(const T_PHGT_D& type)
+{
+    return type.element != HINGE_ELEMENT::GeneralLink && type.element != HINGE_ELEMENT::PointSpring;
+}
+
 /// A component of a hinge type.
 inline const T_HINGE_COMPONENT& At(const T_PHGT_D& type, HINGE_COMPONENT c)
 {

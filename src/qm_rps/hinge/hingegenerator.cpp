@@ -1,79 +1,127 @@
 #include "qm_rps/hinge/hingegenerator.h"
 
 #include "qm_base/msgfunction.h"
+#include "qm_base/textformat.h"
 #include "qm_db/editscope.h"
+#include "qm_rps/hinge/hingelabels.h"
+#include "qm_rps/hinge/hingetable.h"
 #include "qm_rps/hinge/hingetypefindings.h"
+#include "qm_rps/hinge/pageyield.h"
 
 #include <set>
 
 namespace {
 
 using zql::lib::MMSGFunction;
+using T_STRENGTHS = std::array<T_SIDES<double>, 6>;
 
-int Refuse(int element, const char* key, T_HINGE_REFUSAL& refusal, const std::string& text = {})
+/// why: in place of the text of the key.
+int Refuse(int element, const std::string& key, T_HINGE_REFUSAL& refusal, std::string why = {})
 {
-    const std::string why = text.empty() ? MMSGFunction::GetValue(key) : text;
-    refusal = {element, key,
-               element == 0
-                   ? why
-                   : MMSGFunction::Format("IDS_QM_HINGE_ELEMENT", {std::to_string(element), why})};
+    if (why.empty()) why = MMSGFunction::GetValue(key);
+    const std::string text =
+        element == 0 ? why
+                     : MMSGFunction::Format("IDS_QM_HINGE_ELEMENT", {std::to_string(element), why});
+    refusal = {element, key, why, text};
     return 0;
 }
 
-/// Strengths of one component from its curve, or from the calculation where they are automatic.
-struct T_STRENGTHS {
-    T_SIDES<double> yield, crack;
-};
-template <class CURVE>
-T_STRENGTHS EnteredStrengths(const CURVE& curve, SKEL_TYPE type)
+/// What a link or a point spring calculates: nothing.
+const CHingeSources::T_RESULT& NoSection()
 {
-    const auto& pos = curve.sides.pos;
-    const auto& neg = curve.symmetric ? pos : curve.sides.neg;
-    T_STRENGTHS s;
-    s.yield = {CHingeGenerator::EnteredYield(pos, type), CHingeGenerator::EnteredYield(neg, type)};
-    if constexpr (std::is_same_v<CURVE, T_SKEL_MULTI>) {
-        if (IsTrilinear(type)) s.crack = {pos.P1, neg.P1};
-    }
-    return s;
+    static const CHingeSources::T_RESULT none;
+    return none;
 }
 
-/// The curve of a component's first page.
-const T_SKEL_CURVE& FirstCurve(const T_HINGE_COMPONENT& c)
+std::string ClassText(MATL_CLASS material)
 {
-    const T_SKEL_CURVE* first = nullptr;
-    ForEachPage(c, [&](HINGE_END, const T_SKEL_CURVE& curve) {
-        if (!first) first = &curve;
+    static constexpr std::array<const char*, 4> keys{
+        "IDS_QM_UI_MATL_CONCRETE", "IDS_QM_UI_MATL_STEEL", "IDS_QM_UI_MATL_COMPOSITE",
+        "IDS_QM_UI_MATL_MASONRY"};
+    const auto at = static_cast<std::size_t>(material);
+    return MMSGFunction::GetValue(at < keys.size() ? keys[at] : "IDS_PUSHOVER_Error");
+}
+
+/// A composite section has concrete and steel.
+bool ClassFits(MATL_CLASS type, MATL_CLASS material)
+{
+    return type == material || (type == MATL_CLASS::Composite && material != MATL_CLASS::Masonry);
+}
+
+/// Elements of walls are beams in the model.
+bool KindFits(HINGE_ELEMENT type, HINGE_ELEMENT element)
+{
+    return (type == HINGE_ELEMENT::Wall ? HINGE_ELEMENT::BeamColumn : type) == element;
+}
+
+bool Differ(double stored, double today)
+{
+    constexpr double kDigits = 1e-6; // a case file may state its strengths in so many digits
+    return !(std::fabs(stored - today) <= kDigits * std::max(std::fabs(stored), std::fabs(today)));
+}
+
+/// Appends the strengths that differ, "My(+) 300, now 280".
+void Compare(const std::string& prefix, const T_STRENGTHS& stored, const T_STRENGTHS& today,
+             std::string& out)
+{
+    for (std::size_t i = 0; i < stored.size(); ++i)
+        for (const bool positive : {true, false}) {
+            const double was = positive ? stored[i].pos : stored[i].neg;
+            const double is = positive ? today[i].pos : today[i].neg;
+            if (!Differ(was, is)) continue;
+            const std::string name = prefix + kComponentNames[i] + (positive ? "(+)" : "(-)");
+            const std::string item = MMSGFunction::Format(
+                "IDS_QM_HINGE_STALE_ITEM", {name, FormatText("%.6g", was), FormatText("%.6g", is)});
+            out += (out.empty() ? "" : "; ") + item;
+        }
+}
+
+/// The strengths of a component with those of the other pages: the J-end's own ones apart.
+void PutStrengths(const T_HINGE_COMPONENT& c, std::size_t i, const CHingeSources::T_RESULT& result,
+                  T_PHGE_D& hinge)
+{
+    const bool two = NeedsIJPages(c);
+    ForEachPage(c, [&](HINGE_END end, const T_SKEL_CURVE& curve) {
+        const T_PAGE_STRENGTH s =
+            PageStrength(curve, c.type, static_cast<HINGE_COMPONENT>(i), result);
+        const bool j = two && end == HINGE_END::J;
+        (j ? hinge.yieldJ : hinge.yield)[i] = {s.yield.pos.value_or(0.0),
+                                               s.yield.neg.value_or(0.0)};
+        (j ? hinge.crackJ : hinge.crack)[i] = s.crack;
     });
-    return *first;
 }
 
 } // namespace
-
-double CHingeGenerator::EnteredYield(const T_SKEL_SIDE& side, SKEL_TYPE)
-{
-    return side.yield;
-}
-
-double CHingeGenerator::EnteredYield(const T_SKEL_MULTI_SIDE& side, SKEL_TYPE type)
-{
-    return IsTrilinear(type) ? side.P2 : side.P1;
-}
 
 int CHingeGenerator::ReadElement(const T_PHGT_D& type, int element, T_HINGE_ELEMENT& out,
                                  T_HINGE_REFUSAL& refusal) const
 {
     T_ELEM_D e;
-    T_HINGE_ELEMENT found;
     if (!m_doc.Attr().GetElem(element, e)) return Refuse(element, "IDS_CMD_IEHP_NO_ELEM", refusal);
-    if (!m_doc.Attr().GetSect(e.section, found.section))
-        return Refuse(element, "IDS_CMD_IEHP_NO_SECT", refusal);
-    if (!m_doc.Attr().GetMatl(e.material, found.material))
-        return Refuse(element, "IDS_CMD_IEHP_NO_MATL", refusal);
-    if (!m_doc.Memb().GetMembLengByIncludeElem(element, found.memberLength))
-        return Refuse(element, "IDS_CMD_IEHP_NO_MEMB", refusal);
-    if (type.element == HINGE_ELEMENT::Wall && !CHingeSources::IsWall(found.section))
-        return Refuse(element, "IDS_CMD_IEHP_NO_WALL", refusal);
-    found.result = m_sources->Strength(e.section, e.material);
+    const HINGE_ELEMENT kind = HingeElementOf(m_doc, element).value_or(HINGE_ELEMENT::BeamColumn);
+    if (!KindFits(type.element, kind))
+        return Refuse(element, "IDS_QM_HINGE_WRONG_KIND", refusal,
+                      MMSGFunction::Format("IDS_QM_HINGE_WRONG_KIND",
+                                           {ElementText(type.element), ElementText(kind)}));
+    T_HINGE_ELEMENT found;
+    found.result = &NoSection();
+    if (HasLineElement(type)) {
+        const T_YIELD_CALC_ELEM has = YieldCalcElemOf(m_doc, element);
+        if (!has.section) return Refuse(element, "IDS_CMD_IEHP_NO_SECT", refusal);
+        if (!has.material) return Refuse(element, "IDS_CMD_IEHP_NO_MATL", refusal);
+        if (!ClassFits(type.material, has.material->type))
+            return Refuse(element, "IDS_QM_HINGE_WRONG_CLASS", refusal,
+                          MMSGFunction::Format("IDS_QM_HINGE_WRONG_CLASS",
+                                               {ClassText(type.material), has.material->name,
+                                                ClassText(has.material->type)}));
+        if (!m_doc.Memb().GetMembLengByIncludeElem(element, found.memberLength))
+            return Refuse(element, "IDS_CMD_IEHP_NO_MEMB", refusal);
+        if (type.element == HINGE_ELEMENT::Wall && !CHingeSources::IsWall(*has.section))
+            return Refuse(element, "IDS_CMD_IEHP_NO_WALL", refusal);
+        found.section = has.section;
+        found.material = has.material;
+        found.result = m_context.sources->Strength(e.section, e.material);
+    }
     out = std::move(found);
     return 1;
 }
@@ -90,24 +138,14 @@ int CHingeGenerator::CalcHinge(int hingeType, int element, T_PHGE_D& out,
     AutoStrengthFindings(type, *e.result, faults);
     if (!faults.empty()) {
         const bool method = e.result->fault == SECT_FAULT::None;
-        return Refuse(element, method ? "IDS_QM_HINGE_NO_METHOD" : MessageKeyOf(e.result->fault),
+        return Refuse(element, method ? faults.front().ruleText : MessageKeyOf(e.result->fault),
                       refusal, method ? faults.front().text : std::string());
     }
     T_PHGE_D hinge;
     hinge.element = element;
     hinge.hingeType = hingeType;
-    for (std::size_t i = 0; i < type.components.size(); ++i) {
-        const T_HINGE_COMPONENT& c = type.components[i];
-        if (!c.active) continue;
-        const T_SKEL_CURVE& curve = FirstCurve(c);
-        T_STRENGTHS s;
-        if (IsAutoYield(curve))
-            s.yield = e.result->strength.yield[i].value_or(T_SIDES<double>{});
-        else
-            s = std::visit([&](const auto& k) { return EnteredStrengths(k, c.type); }, curve);
-        hinge.yield[i] = s.yield;
-        hinge.crack[i] = s.crack;
-    }
+    for (std::size_t i = 0; i < type.components.size(); ++i)
+        if (type.components[i].active) PutStrengths(type.components[i], i, *e.result, hinge);
     out = hinge;
     return 1;
 }
@@ -116,6 +154,13 @@ int CHingeGenerator::Generate(int hingeType, const std::vector<int>& elements,
                               T_HINGE_REFUSAL& refusal)
 {
     if (elements.empty()) return Refuse(0, "IDS_CMD_IEHP_NO_ELEM", refusal);
+    if (T_PHGT_D type; m_doc.Attr().GetPhgt(hingeType, type)) {
+        const std::vector<T_FINDING> broken = HingeTypeFindings(type, m_context);
+        if (!broken.empty())
+            return Refuse(
+                0, broken.front().messageKey, refusal,
+                MMSGFunction::Format("IDS_QM_HINGE_BROKEN_TYPE", {type.name, broken.front().text}));
+    }
     std::map<int, T_PHGE_D> fresh; // by element
     for (const int element : elements)
         if (!CalcHinge(hingeType, element, fresh[element], refusal)) return 0;
@@ -141,21 +186,46 @@ std::vector<T_FINDING> CHingeGenerator::ElementFindings(int hingeType) const
 {
     T_PHGT_D type;
     std::vector<T_FINDING> out;
-    if (!m_doc.Attr().GetPhgt(hingeType, type) || !AnyAutoYield(type)) return out;
-    for (const int element : m_doc.Attr().GetElemsByPhgt(hingeType)) {
+    if (!m_doc.Attr().GetPhgt(hingeType, type)) return out;
+    const auto add = [&](const std::string& key, const std::string& text) {
+        T_FINDING& f = out.emplace_back();
+        f.ruleText = f.messageKey = key;
+        f.text = text;
+    };
+    for (const auto& [key, hinge] : HingesOf(m_doc)) {
+        if (hinge.hingeType != hingeType) continue;
         T_HINGE_ELEMENT e;
         T_HINGE_REFUSAL refusal;
-        const std::string field = "element " + std::to_string(element);
         const std::size_t first = out.size();
-        if (ReadElement(type, element, e, refusal)) {
+        if (ReadElement(type, hinge.element, e, refusal))
             AutoStrengthFindings(type, *e.result, out);
-        } else {
-            T_FINDING& f = out.emplace_back();
-            f.ruleText = f.messageKey = refusal.key;
-            f.text = MMSGFunction::GetValue(refusal.key);
-        }
+        else
+            add(refusal.key, refusal.why);
+        if (const std::string stale = StaleText(hinge); !stale.empty())
+            add("IDS_QM_HINGE_STALE", MMSGFunction::Format("IDS_QM_HINGE_STALE", {stale}));
         for (std::size_t i = first; i < out.size(); ++i)
-            out[i].field = field;
+            out[i].field = "element " + std::to_string(hinge.element);
     }
     return out;
+}
+
+std::string CHingeGenerator::StaleText(const T_PHGE_D& hinge) const
+{
+    T_PHGE_D today;
+    T_HINGE_REFUSAL refusal;
+    std::string text;
+    if (!HasStrengths(hinge) || !CalcHinge(hinge.hingeType, hinge.element, today, refusal))
+        return text;
+    Compare("", hinge.yield, today.yield, text);
+    Compare("", hinge.crack, today.crack, text);
+    Compare("J ", hinge.yieldJ, today.yieldJ, text);
+    Compare("J ", hinge.crackJ, today.crackJ, text);
+    return text;
+}
+
+bool CHingeGenerator::HasStrengths(const T_PHGE_D& hinge)
+{
+    const T_STRENGTHS none{};
+    return hinge.yield != none || hinge.crack != none || hinge.yieldJ != none ||
+           hinge.crackJ != none;
 }

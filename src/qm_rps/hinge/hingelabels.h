@@ -1,15 +1,18 @@
 // Names and units that the editors of hinges show.
 #pragma once
 
-#include "qm_db/records.h"
+#include "qm_rps/hinge/hingesources.h"
 
+#include <memory>
 #include <string>
 #include <vector>
 
-/// The type that an editor of one of its parts belongs to, and the units of its values.
+/// The type that an editor of one of its parts belongs to, the units of its values, and what its
+/// automatic strengths are calculated from (null: nothing is).
 struct T_HINGE_OWNER {
     T_PHGT_D type;
     T_UNITS units;
+    std::shared_ptr<const CHingeSources> sources{};
 };
 
 /// Text of an element type; a value outside the five is shown as an error, not refused.

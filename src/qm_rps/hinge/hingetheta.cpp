@@ -57,7 +57,7 @@ double Theta(const T_THETA_LOOKUP& lookup, HINGE_COMPONENT component, HINGE_LOCA
              INIT_STIFFNESS option, double userStiffness, double strength)
 {
     T_BASIS b;
-    if (!ReadBasis(lookup, end, b)) return 0.0;
+    if (lookup.needsSection && !ReadBasis(lookup, end, b)) return 0.0;
     const auto k = CHingeTheta::CalcStiffness(lookup, component, end, option, userStiffness);
     return k ? Deformation(strength, *k) : 0.0;
 }
@@ -72,24 +72,25 @@ std::optional<double> CHingeTheta::CalcStiffness(const T_THETA_LOOKUP& lookup,
         return std::isfinite(userStiffness) ? std::optional(userStiffness) : std::nullopt;
     T_BASIS b;
     if (!ReadBasis(lookup, end, b)) return std::nullopt;
-    const double E = lookup.material->E, L = lookup.memberLength;
+    const double E = lookup.material->E, L = lookup.perLength ? 1.0 : lookup.memberLength;
     const double G = E / (2.0 * (1.0 + lookup.material->nu));
-    const bool elastic = option == INIT_STIFFNESS::Elastic;
+    const bool shear = option == INIT_STIFFNESS::Elastic, elastic = shear && !lookup.perLength;
+    const double n = lookup.perLength ? 1.0 : RotationFactor(option);
     switch (component) {
     case HINGE_COMPONENT::Fx:
         return Positive(E * b.section.area * b.factors->area / L);
     case HINGE_COMPONENT::Mx:
         return Positive(G * b.section.J * b.factors->J / L);
     case HINGE_COMPONENT::Fy:
-        return elastic ? Positive(G * b.section.Asy * b.factors->Asy) : std::nullopt;
+        return shear ? Positive(G * b.section.Asy * b.factors->Asy) : std::nullopt;
     case HINGE_COMPONENT::Fz:
-        return elastic ? Positive(G * b.section.Asz * b.factors->Asz) : std::nullopt;
+        return shear ? Positive(G * b.section.Asz * b.factors->Asz) : std::nullopt;
     case HINGE_COMPONENT::My:
         if (elastic) return std::nullopt;
-        return Positive(RotationFactor(option) * E * b.section.Iyy * b.factors->Iyy / L);
+        return Positive(n * E * b.section.Iyy * b.factors->Iyy / L);
     case HINGE_COMPONENT::Mz:
         if (elastic) return std::nullopt;
-        return Positive(RotationFactor(option) * E * b.section.Izz * b.factors->Izz / L);
+        return Positive(n * E * b.section.Izz * b.factors->Izz / L);
     }
     return std::nullopt;
 }

@@ -11,13 +11,16 @@ struct T_THETA_LOOKUP {
     const T_SECT_D* section = nullptr;
     const T_MATL_D* material = nullptr;
     double memberLength = 0.0; // of the member that contains the element
+    bool perLength = false;    // the hinge is one of curvatures and strains: EI, EA, GJ in place
+                               // of n EI/L, EA/L, GJ/L
+    bool needsSection = true;  // false for links and springs, which have a user stiffness alone
 };
 
-/// Rotation My / K and displacement Fy / K at first yield. Values in one consistent unit system;
-/// the sign of the strength passes to the result. Shapes with dimensions are evaluated from these
-/// (CSectionProperties), a section given by values with the values.
-/// Every case outside the stated ones gives 0: a failed look-up, another component, end or option,
-/// a stiffness below 1e-10 (or negative), anything that is not finite.
+/// Rotation (or curvature) My / K and displacement Fy / K at first yield. Values in one consistent
+/// unit system; the sign of the strength passes to the result. Shapes with dimensions are evaluated
+/// from these (CSectionProperties), a section given by values with the values. Every case outside
+/// the stated ones gives 0: a failed look-up, another component, end or option, a stiffness below
+/// 1e-10 (or negative), anything that is not finite.
 class CHingeTheta {
 public:
     /// Initial stiffness at an end: the user stiffness; else EA/L of Fx and GJ/L of Mx (any other

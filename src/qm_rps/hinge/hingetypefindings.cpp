@@ -1,9 +1,11 @@
 #include "qm_rps/hinge/hingetypefindings.h"
 
+#include "qm_base/textformat.h"
 #include "qm_rps/hinge/curvefindings.h"
 #include "qm_rps/hinge/hingechoices.h"
 #include "qm_rps/hinge/hingemirror.h"
 #include "qm_rps/hinge/hingepartfindings.h"
+#include "qm_rps/hinge/pageyield.h"
 
 #include <algorithm>
 
@@ -24,11 +26,6 @@ struct T_TYPE_CHECK {
     }
 };
 using T = T_TYPE_CHECK;
-
-bool HasLineElement(const T_PHGT_D& t)
-{
-    return t.element != HINGE_ELEMENT::GeneralLink && t.element != HINGE_ELEMENT::PointSpring;
-}
 
 bool FibresFit(const T& t)
 {
@@ -76,6 +73,9 @@ constexpr T_RULE<T> kTypeRules[] = {
     {{.message = "IDS_CMD_IEHP_NO_RBAR", .field = "section"},
      [](const T& t) { return !t.Section()->bars.empty(); },
      NeedsBars},
+    {{.message = "IDS_QM_HINGE_SPAN", .field = "length.span"},
+     [](const T& t) { return Below(0, t.type.length.span); },
+     [](const T& t) { return !t.type.length.autoSpan; }},
 };
 
 /// An active component's curve type that is not offered for such a type, or not under the codes.
@@ -111,6 +111,55 @@ void PartFindings(const T_PHGT_D& type, std::vector<T_FINDING>& out)
     if (type.pmm) Append("pmm.", PmmFindings(*type.pmm), out);
 }
 
+/// The strengths of one side.
+struct T_STRENGTH_SIDE {
+    double crack, yield;
+    HINGE_SIDE side;
+};
+std::array<T_STRENGTH_SIDE, 2> SidesOf(const T_PAGE_STRENGTH& s)
+{
+    return {{{s.crack.pos, s.yield.pos.value_or(0.0), HINGE_SIDE::Positive},
+             {s.crack.neg, s.yield.neg.value_or(0.0), HINGE_SIDE::Negative}}};
+}
+/// An entered crack strength beside a calculated yield strength.
+constexpr T_HINGE_RULE<T_STRENGTH_SIDE> kCalculated[] = {
+    {{.message = kHingeItemMessage,
+      .key = {"IDS_DB_CRACK_FORCE_COMP_PLUS", "IDS_DB_CRACK_FORCE_COMP_MNUS"},
+      .field = "sides.pos.P1",
+      .point = "P1"},
+     [](const T_STRENGTH_SIDE& s) { return NotAbove(s.crack, s.yield); }},
+};
+
+void RatioWarnings(const T_PHGT_D& type, std::vector<T_FINDING>& out)
+{
+    std::vector<T_FINDING> found;
+    int curves = 0;
+    for (std::size_t i = 0; i < type.components.size(); ++i) {
+        const T_HINGE_COMPONENT& c = type.components[i];
+        if (!c.active) continue;
+        ForEachPage(c, [&](HINGE_END end, const T_SKEL_CURVE& curve) {
+            const auto* m = std::get_if<T_SKEL_MULTI>(&curve);
+            if (!m || m->useDeformation) return;
+            ++curves;
+            RatioWarnings(*m, c.type, {static_cast<int>(i), end}, found);
+        });
+    }
+    if (curves < 2) return; // the warning is about several curves at once
+    out.insert(out.end(), found.begin(), found.end());
+}
+
+/// Entered strengths by axial force that say nothing about the hinge without one.
+void ForceWarning(const T_SKEL_FEMA& curve, const T_HINGE_PLACE& place, std::vector<T_FINDING>& out)
+{
+    const std::optional<double> force = ForceAwayFrom0(curve);
+    if (!force || curve.autoYield) return;
+    const std::string text = "P = " + ShortestText(*force);
+    out.push_back(FindingOf(T_HINGE_HEAD{.message = "IDS_QM_HINGE_FORCES_AWAY",
+                                         .text = text.c_str(),
+                                         .field = "curves"},
+                            place));
+}
+
 } // namespace
 
 bool IsAutoYield(const T_SKEL_CURVE& curve)
@@ -130,17 +179,23 @@ bool AnyAutoYield(const T_PHGT_D& type)
 void AutoStrengthFindings(const T_PHGT_D& type, const CHingeSources::T_RESULT& result,
                           std::vector<T_FINDING>& out)
 {
+    const char* why =
+        result.fault == SECT_FAULT::None ? "IDS_QM_HINGE_NO_METHOD" : MessageKeyOf(result.fault);
     for (std::size_t i = 0; i < type.components.size(); ++i) {
         const T_HINGE_COMPONENT& c = type.components[i];
-        if (!c.active || (result.fault == SECT_FAULT::None && result.strength.yield[i])) continue;
-        const char* why = result.fault == SECT_FAULT::None ? "IDS_QM_HINGE_NO_METHOD"
-                                                           : MessageKeyOf(result.fault);
+        if (!c.active) continue;
         ForEachPage(c, [&](HINGE_END end, const T_SKEL_CURVE& curve) {
-            if (IsAutoYield(curve))
+            if (!IsAutoYield(curve)) return;
+            const T_HINGE_PLACE place{static_cast<int>(i), end};
+            const T_PAGE_STRENGTH s =
+                PageStrength(curve, c.type, static_cast<HINGE_COMPONENT>(i), result);
+            if (result.fault != SECT_FAULT::None || !s.yield.pos)
                 out.push_back(FindingOf(T_HINGE_HEAD{.message = "IDS_QM_HINGE_AUTO_STRENGTH",
                                                      .key = {why},
                                                      .field = "autoYield"},
-                                        {static_cast<int>(i), end}));
+                                        place));
+            else
+                WalkRulesBySide(kCalculated, SidesOf(s), place, out);
         });
     }
 }
@@ -172,17 +227,15 @@ std::vector<T_FINDING> HingeTypeFindings(const T_PHGT_D& type, const T_HINGE_CON
 std::vector<T_FINDING> HingeTypeWarnings(const T_PHGT_D& type)
 {
     std::vector<T_FINDING> out;
-    int curves = 0;
+    RatioWarnings(type, out);
     for (std::size_t i = 0; i < type.components.size(); ++i) {
         const T_HINGE_COMPONENT& c = type.components[i];
         if (!c.active) continue;
         ForEachPage(c, [&](HINGE_END end, const T_SKEL_CURVE& curve) {
-            const auto* m = std::get_if<T_SKEL_MULTI>(&curve);
-            if (!m || m->useDeformation) return;
-            ++curves;
-            RatioWarnings(*m, c.type, {static_cast<int>(i), end}, out);
+            const T_HINGE_PLACE place{static_cast<int>(i), end};
+            PointWarnings(curve, place, out);
+            if (const auto* f = std::get_if<T_SKEL_FEMA>(&curve)) ForceWarning(*f, place, out);
         });
     }
-    if (curves < 2) out.clear(); // the warning is about several curves at once
     return out;
 }

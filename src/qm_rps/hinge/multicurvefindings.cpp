@@ -67,6 +67,11 @@ bool EntersTrilinear(const S& s)
 {
     return !s.m.autoYield && s.tri;
 }
+/// Calculated strengths have no crack strength; it is entered.
+bool EntersCrack(const S& s)
+{
+    return s.m.autoYield && s.tri;
+}
 bool EntersUltimate(const S& s)
 {
     return s.m.useUltimate;
@@ -108,6 +113,8 @@ constexpr R kStrengths[] = {
       .field = "sides.pos.P2", .point = "P2"}, Positive<kP2>, EntersTrilinear},
     {{.message = kItem, .key = {"IDS_DB_CRACK_FORCE_COMP_PLUS", "IDS_DB_CRACK_FORCE_COMP_MNUS"},
       .field = "sides.pos.P1", .point = "P1"}, InOrder<kP1, kP2>, EntersTrilinear},
+    {{.message = "IDS_QM_HINGE_NO_CRACK", .text = "P1 > 0", .field = "sides.pos.P1",
+      .point = "P1"}, Positive<kP1>, EntersCrack},
     {{.message = kItem, .key = {"IDS_DB_ULTIMATE_FORCE_POS", "IDS_DB_ULTIMATE_FORCE_NEG"},
       .momentKey = {"IDS_DB_ULTIMATE_MOMENT_POS", "IDS_DB_ULTIMATE_MOMENT_NEG"},
       .field = "sides.pos.P3", .point = "P3"}, Positive<kP3>, EntersUltimate},

@@ -207,6 +207,19 @@ TEST(HingeTypeFindings, PartsOfTheTypeAreCheckedUnderTheirNames)
             {"user curves", [](T& t) { t.pmm.emplace().Pmax = 0; }},
             {"user Pmax", [](T& t) { t.pmm.emplace().Pmax = -1e-9; }, "IDS_PUSHOVER_PMAX_POS",
              "pmm.Pmax"},
+            {"own span", [](T& t) { t.length.autoSpan = false; }, "IDS_QM_HINGE_SPAN",
+             "length.span"},
+            {"automatic trilinear without a crack strength",
+             [](T& t) { t.components[4] = ComponentWith(SKEL_TYPE::Trilinear, T_SKEL_MULTI()); },
+             "IDS_QM_HINGE_NO_CRACK", "sides.pos.P1"},
+            {"crack strength above the calculated one, Zy fy = 550",
+             [](T& t) {
+                 T_SKEL_MULTI m;
+                 m.sides.pos.P1 = 550.001, m.sides.neg.P1 = 550;
+                 t.components[4] = ComponentWith(SKEL_TYPE::Trilinear, m);
+                 t.section = t.sectionMaterial = 1, m.symmetric = false;
+             },
+             kHingeItemMessage, "sides.pos.P1"},
             {"surface without axes",
              [](T& t) {
                  T_YIELD_LEVEL& l = t.yieldSurface.emplace().yield;
@@ -241,5 +254,39 @@ TEST(HingeTypeWarnings, RatiosMustSuitSeveralCurvesAtOnce)
         for (std::size_t i = 0; i < c.curves; ++i)
             t.components[4 + i] = ComponentWith(c.type, m);
         EXPECT_EQ(c.warnings, HingeTypeWarnings(t).size()) << "row " << &c - kCases;
+    }
+}
+
+TEST(HingeTypeWarnings, PointsLieWhereTheMeasureHasThem)
+{
+    const struct {
+        const char* rule; // of the only warning; "": none
+        void (*spoil)(T_SKEL_FEMA&);
+    } kCases[] = {
+        {"", [](T_SKEL_FEMA&) {}},
+        {"D(B) = 1", [](T_SKEL_FEMA& f) { f.sides.pos.B.deform = 1.1; }},
+        {"D(B) = 1", [](T_SKEL_FEMA& f) { f.sides.neg.B.deform = -0.9; }},
+        {"D(B) = 0",
+         [](T_SKEL_FEMA& f) { f.measure = SKEL_MEASURE::Plastic, f.sides.neg.B.deform = 0; }},
+        {"F(B) = 1", [](T_SKEL_FEMA& f) { f.sides.neg.B.strength = -1.1; }},
+        {"", [](T_SKEL_FEMA& f) { f.sides.pos.CP = 8; }},
+        {"CP <= D(E)", [](T_SKEL_FEMA& f) { f.sides.pos.CP = 8.001; }},
+        {"", [](T_SKEL_FEMA& f) { f.sides.pos.CP = 9, f.compliance = false; }},
+        {"P = 500",
+         [](T_SKEL_FEMA& f) {
+             f.multiCurve = true, f.curves = {{500, f.sides}, {900, f.sides}};
+         }},
+        {"",
+         [](T_SKEL_FEMA& f) {
+             f.multiCurve = true, f.curves = {{0, f.sides}, {9, f.sides}};
+         }},
+    };
+    for (const auto& c : kCases) {
+        SCOPED_TRACE(&c - kCases);
+        T_PHGT_D t = Type();
+        c.spoil(Fema(t));
+        const auto found = HingeTypeWarnings(t);
+        EXPECT_EQ(*c.rule ? 1u : 0u, found.size());
+        EXPECT_EQ(c.rule, First(found));
     }
 }
