@@ -10,6 +10,8 @@ public:
     T_HINGE_OWNER m_owner; // for units
     using T_BLOCKS = T_ENDS<std::array<double, 6>>;
 
+    bool m_relative = false; // the lengths are fractions of the member's length
+
     /// Both blocks, whole.
     void SetData(const T_BLOCKS& blocks) { m_blocks = blocks; }
     const T_BLOCKS& GetData() const { return m_blocks; }

@@ -35,8 +35,17 @@ T_SKEL_MULTI* CPO_HingeSkcvTabDlg::Curve(HINGE_END end)
     return std::get_if<T_SKEL_MULTI>(j ? &m_data.curves.J : &m_data.curves.I);
 }
 
+T_PAGE_VALUES CPO_HingeSkcvTabDlg::Calculated(HINGE_END end)
+{
+    const auto* curve = Curve(end);
+    return curve ? CalculatedPage(m_owner, m_component, end, *curve) : T_PAGE_VALUES{};
+}
+
 void CPO_HingeSkcvTabDlg::OnEdited()
 {
+    ForEachPage(m_data, [&](HINGE_END end, T_SKEL_CURVE& curve) {
+        PutCalculated(Calculated(end), m_data.type, curve);
+    });
     m_data = MirroredComponent(m_data);
 }
 

@@ -4,7 +4,7 @@
 
 #include "qm_base/checkeddialog.h"
 #include "qm_rps/hinge/hingefindings.h"
-#include "qm_rps/hinge/hingelabels.h"
+#include "qm_rps/hinge/pageyield.h"
 
 class CPO_HingeSkcvTabDlg : public CCheckedDialog {
 public:
@@ -17,8 +17,11 @@ public:
 
     T_HINGE_COMPONENT& Component() { return m_data; }
     HINGE_COMPONENT Which() const { return m_component; }
-    /// After each edit: the negative side of a symmetric curve follows the positive one.
+    /// After each edit: automatic pages show what is calculated, the negative side of a symmetric
+    /// curve follows the positive one.
     void OnEdited();
+    /// What an automatic page calculates from the type's own section; see CalculatedPage.
+    T_PAGE_VALUES Calculated(HINGE_END end);
     /// The curve of a page, or null before Data2Dlg.
     T_SKEL_MULTI* Curve(HINGE_END end);
 

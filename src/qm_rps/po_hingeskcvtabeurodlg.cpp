@@ -28,8 +28,17 @@ T_SKEL_EC8* CPO_HingeSkcvTabEuroDlg::Curve(HINGE_END end)
     return std::get_if<T_SKEL_EC8>(j ? &m_data.curves.J : &m_data.curves.I);
 }
 
+T_PAGE_VALUES CPO_HingeSkcvTabEuroDlg::Calculated(HINGE_END end)
+{
+    const auto* curve = Curve(end);
+    return curve ? CalculatedPage(m_owner, m_component, end, *curve) : T_PAGE_VALUES{};
+}
+
 void CPO_HingeSkcvTabEuroDlg::OnEdited()
 {
+    ForEachPage(m_data, [&](HINGE_END end, T_SKEL_CURVE& curve) {
+        PutCalculated(Calculated(end), m_data.type, curve);
+    });
     m_data = MirroredComponent(m_data);
 }
 

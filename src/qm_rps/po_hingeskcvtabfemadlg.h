@@ -8,7 +8,7 @@
 
 #include "qm_base/checkeddialog.h"
 #include "qm_rps/hinge/hingefindings.h"
-#include "qm_rps/hinge/hingelabels.h"
+#include "qm_rps/hinge/pageyield.h"
 
 #include <array>
 #include <optional>
@@ -96,8 +96,11 @@ public:
     T_SKEL_FEMA ShownCurve(HINGE_COMPONENT c, HINGE_END end);
     /// Limits of demand / capacity in use or not.
     void OnDcRatioChk(HINGE_COMPONENT c, HINGE_END end, bool on);
-    /// After each edit: the negative side of a symmetric curve follows the positive one.
+    /// After each edit: automatic pages show what is calculated, the negative side of a symmetric
+    /// curve follows the positive one.
     void OnEdited();
+    /// What an automatic page calculates from the type's own section; see CalculatedPage.
+    T_PAGE_VALUES Calculated(HINGE_COMPONENT c, HINGE_END end);
     /// A finding's field on the page: of the chosen axial force as of the curve itself.
     std::string FieldOnPages(const T_FINDING& f);
     /// The first component that is edited.

@@ -59,8 +59,21 @@ void CPO_HingeSkcvTabFemaDlg::OnDcRatioChk(HINGE_COMPONENT c, HINGE_END end, boo
 
 void CPO_HingeSkcvTabFemaDlg::OnEdited()
 {
-    for (auto& component : m_components)
-        if (component) *component = MirroredComponent(*component);
+    for (std::size_t i = 0; i < m_components.size(); ++i) {
+        auto& component = m_components[i];
+        if (!component) continue;
+        const auto c = static_cast<HINGE_COMPONENT>(i);
+        ForEachPage(*component, [&](HINGE_END end, T_SKEL_CURVE& curve) {
+            PutCalculated(Calculated(c, end), component->type, curve);
+        });
+        *component = MirroredComponent(*component);
+    }
+}
+
+T_PAGE_VALUES CPO_HingeSkcvTabFemaDlg::Calculated(HINGE_COMPONENT c, HINGE_END end)
+{
+    const T_SKEL_FEMA* curve = Curve(c, end);
+    return curve ? CalculatedPage(m_owner, c, end, *curve) : T_PAGE_VALUES{};
 }
 
 std::string CPO_HingeSkcvTabFemaDlg::FieldOnPages(const T_FINDING& f)

@@ -242,6 +242,8 @@ int CPO_HingeTypeDlg::OnYieldSurfaceDlgDlg()
     const SKEL_TYPE curve = YieldSurfaceCurve(m_type);
     if (IsTrilinear(curve) && !surface.crack) surface.crack.emplace();
     CPO_HingeYieldPropDlgNew dlg(surface, curve);
+    dlg.m_calculated = CalculatedLevel(Owner());
+    if (!m_type.yieldSurface) (void)dlg.OnCalculateBtn(); // zeros where there is none
     if (!RunOn(dlg, *this)) return 0;
     m_type.yieldSurface = surface;
     return 1;
@@ -293,8 +295,10 @@ int CPO_HingeTypeDlg::OnBtnHingeLength()
     dlg.SetView(View());
     dlg.m_owner = Owner();
     dlg.SetData(m_type.length.components);
+    dlg.m_relative = m_type.length.relative;
     if (!dlg.DoModal()) return 0;
     m_type.length.components = dlg.GetData();
+    m_type.length.relative = dlg.m_relative;
     return 1;
 }
 

@@ -40,7 +40,7 @@ public:
     const T_PHGT_D& Type() const { return m_type; }
     /// The type as edited, for members that nothing else follows: name, references, flags.
     T_PHGT_D& Edited() { return m_type; }
-    T_HINGE_OWNER Owner() const { return {m_type, m_context.units}; }
+    T_HINGE_OWNER Owner() const { return {m_type, m_context.units, m_context.sources}; }
     /// The page that the preview shows.
     CHingePages& Preview() { return m_preview; }
 

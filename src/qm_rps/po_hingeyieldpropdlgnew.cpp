@@ -12,6 +12,16 @@ int CPO_HingeYieldPropDlgNew::OnOK()
     return 1;
 }
 
+int CPO_HingeYieldPropDlgNew::OnCalculateBtn()
+{
+    if (!m_calculated) return 0;
+    const bool y = m_surface.yield.y.used, z = m_surface.yield.z.used;
+    m_surface.yield = *m_calculated;
+    m_surface.yield.y.used = y;
+    m_surface.yield.z.used = z;
+    return 1;
+}
+
 std::vector<CPO_HingeYieldPropDlgNew::T_LEVEL> CPO_HingeYieldPropDlgNew::Levels()
 {
     if (IsTrilinear(m_type) && !m_surface.crack) m_surface.crack.emplace();

@@ -24,7 +24,12 @@ public:
     }
 
     T_YIELD_SURFACE m_surface; // as edited
-    bool m_showValue = false;  // IDS_RPS_Show_Value against IDS_RPS_Show_Ratio
+    /// The yield level that section and material of the type give; empty: they give none.
+    std::optional<T_YIELD_LEVEL> m_calculated;
+    /// Replaces the yield level by the calculated one; axes stay in use or not. 0: there is none.
+    [[nodiscard]] int OnCalculateBtn();
+
+    bool m_showValue = false; // IDS_RPS_Show_Value against IDS_RPS_Show_Ratio
 
     /// See YieldSurfaceFindings.
     std::vector<T_FINDING> Findings() const override;

@@ -18,6 +18,7 @@ T_BACKBONE_PAGE PageOf(DLG& dlg, HINGE_END end, const std::string& prefix)
     page.sides = [curve]() -> T_SIDES<T_SKEL_SIDE>& { return curve().sides; };
     page.asymmetric = [curve] { return !curve().symmetric; };
     page.userYield = [curve] { return !curve().autoYield; };
+    page.calculated = [&dlg, end] { return dlg.Calculated(end); };
     page.measure = [curve] { return curve().measure; };
     page.userStiffness = [curve] { return curve().initStiffness == INIT_STIFFNESS::User; };
     page.negativeStiffness = page.asymmetric;

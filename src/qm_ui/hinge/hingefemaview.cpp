@@ -46,6 +46,7 @@ T_BACKBONE_PAGE BackboneOf(const T_FEMA_PAGE& p)
     page.sides = [p]() -> T_SIDES<T_SKEL_SIDE>& { return p.Sides(); };
     page.asymmetric = p.Is(&T_SKEL_FEMA::symmetric, false);
     page.userYield = p.Is(&T_SKEL_FEMA::autoYield, false);
+    page.calculated = [p] { return p.dlg.Calculated(p.c, p.end); };
     page.measure = [p] { return p.Curve().measure; };
     page.criteria = p.Is(&T_SKEL_FEMA::compliance);
     page.userStiffness = [p] { return p.Curve().initStiffness == INIT_STIFFNESS::User; };

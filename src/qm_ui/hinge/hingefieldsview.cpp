@@ -139,32 +139,40 @@ void AddCriteriaCells(CFormView& form, const T_BACKBONE_PAGE& page)
     form.EndGroup();
 }
 
+void AddByElementNote(CFormView& form, std::function<bool()> isYieldShown)
+{
+    Set(form.Note(KeyText("IDS_QM_UI_HINGE_BY_ELEMENT")), "byElement", {},
+        [isYieldShown] { return !isYieldShown(); });
+}
+
 void AddYieldCells(CFormView& form, const T_BACKBONE_PAGE& page)
 {
     const bool moment = page.component >= HINGE_COMPONENT::Mx;
     const auto stiffness = [page] {
         return StiffnessHead("IDS_QM_UI_HINGE_USER_STIFFNESS", page.component, page.owner);
     };
+    const auto yieldShown = [page] { return page.userYield() || page.calculated().yield.pos; };
+    AddByElementNote(form, yieldShown);
     form.Cells({{}, PlainLabel("(+)"), PlainLabel("(-)")});
     AddSideRow(form,
-               {page.prefix,
-                "yield",
+               {page.prefix, "yield",
                 [page, moment] {
                     return StrengthHead(moment ? "IDS_RPS_PUSHOVER_YIELD_MOMENT"
                                                : "IDS_RPS_PUSHOVER_YIELD_FROCE",
                                         page.component, page.owner);
                 },
-                page.asymmetric,
-                {},
-                page.userYield},
+                page.asymmetric, yieldShown, page.userYield},
                page.sides, Member(&T_SKEL_SIDE::yield));
     AddSideRow(form,
-               {page.prefix, "yieldDeform",
+               {page.prefix,
+                "yieldDeform",
                 [page] {
                     return DeformHead(YieldDeformKey(page.component, page.owner.type.definition),
                                       page.component, page.owner);
                 },
-                page.asymmetric},
+                page.asymmetric,
+                {},
+                [page] { return !page.calculated().deform.pos; }},
                page.sides, Member(&T_SKEL_SIDE::yieldDeform));
     AddSideRow(
         form,

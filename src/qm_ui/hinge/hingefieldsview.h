@@ -60,6 +60,7 @@ struct T_BACKBONE_PAGE {
     std::function<T_SIDES<T_SKEL_SIDE>&()> sides{};
     std::function<bool()> asymmetric{};
     std::function<bool()> userYield{};
+    std::function<T_PAGE_VALUES()> calculated{}; // where the strengths are automatic
     std::function<SKEL_MEASURE()> measure{};
     std::function<bool()> criteria{};          // are in use
     std::function<bool()> userStiffness{};     // is chosen
@@ -67,6 +68,9 @@ struct T_BACKBONE_PAGE {
     /// Names in place of the usual ones: strength, deformation; empty: the usual ones.
     std::function<std::string()> strengthName{}, deformName{};
 };
+/// Says that automatic strengths are calculated for each element, where no value can be shown.
+void AddByElementNote(CFormView& form, std::function<bool()> isYieldShown);
+
 /// Points B to E: deformation and strength of both sides.
 void AddPointCells(CFormView& form, const T_BACKBONE_PAGE& page);
 /// IO, LS and CP of both sides.

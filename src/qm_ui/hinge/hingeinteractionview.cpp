@@ -108,6 +108,9 @@ void BuildSurface(CFormView& form, SURFACE& dlg)
                    [&dlg, aboutY](const bool& on) { dlg.OnAxisChk(aboutY, on); }})
             .name = aboutY ? "useY" : "useZ";
     }
+    form.NextColumn();
+    Set(form.Button(KeyText("IDS_QM_UI_HINGE_CALCULATE"), [&dlg] { (void)dlg.OnCalculateBtn(); }),
+        "calculate", [&dlg] { return dlg.m_calculated.has_value(); });
     form.EndColumns();
     for (const SURFACE::T_LEVEL& level : dlg.Levels())
         AddLevel(form, dlg, level, findings);

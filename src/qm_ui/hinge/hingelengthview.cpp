@@ -14,13 +14,19 @@ std::vector<TextFn> EndHeads()
     return {{}, KeyText("IDS_RPS_PO_LOCATION_I_end"), KeyText("IDS_RPS_PO_LOCATION_J_end")};
 }
 
+/// "My of L", "My (m)".
+std::string LengthHead(const char* name, bool relative, const T_UNITS& units)
+{
+    return relative ? name + (" " + zql::lib::MMSGFunction::GetValue("IDS_QM_UI_HINGE_OF_L"))
+                    : HingeHead(name, kDimLength, units);
+}
+
 /// Lengths of an axis at both ends, in units of length or as fractions.
 void AddLengthRow(CFormView& form, CPO_HingeLengthMThetaDlg& dlg, const char* name,
                   T_ENDS<double>& ends, bool fraction)
 {
     const TextFn text = [&dlg, name, fraction] {
-        return fraction ? name + (" " + zql::lib::MMSGFunction::GetValue("IDS_QM_UI_HINGE_OF_L"))
-                        : HingeHead(name, kDimLength, dlg.m_owner.units);
+        return LengthHead(name, fraction, dlg.m_owner.units);
     };
     const auto shown = [&dlg, fraction] { return dlg.AbsoluteFieldsHidden() == fraction; };
     const std::string field = std::string(name) + (fraction ? ".relative." : ".");
@@ -45,13 +51,14 @@ void BuildMTheta(CFormView& form, CPO_HingeLengthMThetaDlg& dlg)
 
 void BuildMPhi(CFormView& form, CPO_HingeLengthMPhiDlg& dlg)
 {
+    form.Flag(KeyText("IDS_QM_UI_HINGE_RELATIVE"), Ref(dlg.m_relative)).name = "relative";
     form.Note(KeyText("IDS_QM_UI_HINGE_MPHI_NOTE"));
     form.Cells(EndHeads());
     // My first: its entry is that of every component.
     for (const std::size_t i : {4, 0, 1, 2, 3, 5}) {
         const auto c = static_cast<HINGE_COMPONENT>(i);
         const TextFn text = [&dlg, i] {
-            return HingeHead(kComponentNames[i], kDimLength, dlg.m_owner.units);
+            return LengthHead(kComponentNames[i], dlg.m_relative, dlg.m_owner.units);
         };
         form.Note(text);
         for (const auto end : {HINGE_LOCATION::IEnd, HINGE_LOCATION::JEnd}) {

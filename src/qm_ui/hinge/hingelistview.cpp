@@ -102,19 +102,28 @@ T_GRID_BINDING HingeGrid(CPushOverHingeListDlg& dlg)
                                                   dlg.Doc().Unit().Units());
                              },
                              CELL_KIND::Number});
-    b.rows = [&dlg] { return dlg.Doc().Data().Model().hinges.size(); };
-    b.text = [&dlg](std::size_t row, std::size_t c) {
-        const CPushOverHingeListDlg::T_ROW r = dlg.Rows(dlg.m_crack).at(row);
+    const auto rows = std::make_shared<std::vector<CPushOverHingeListDlg::T_ROW>>();
+    b.rows = [&dlg, rows] {
+        *rows = dlg.Rows(dlg.m_crack);
+        return rows->size();
+    };
+    b.mark = [rows](std::size_t row, std::size_t) {
+        const std::string& stale = rows->at(row).stale;
+        return stale.empty() ? stale : MMSGFunction::Format("IDS_QM_HINGE_STALE", {stale});
+    };
+    b.text = [rows](std::size_t row, std::size_t c) {
+        const CPushOverHingeListDlg::T_ROW& r = rows->at(row);
         if (c == 0) return std::to_string(r.key);
         if (c == 1) return std::to_string(r.element);
         if (c == 2) return r.type;
         const T_SIDES<double>& s = r.strengths[(c - kFirst) / 2];
-        return ShortestText((c - kFirst) % 2 == 0 ? s.pos : s.neg);
+        const double v = (c - kFirst) % 2 == 0 ? s.pos : s.neg;
+        return v == 0.0 ? std::string("-") : ShortestText(v);
     };
-    BindSelection(b, dlg, [&dlg] {
+    BindSelection(b, dlg, [rows] {
         std::vector<int> keys;
-        for (const auto& entry : dlg.Doc().Data().Model().hinges)
-            keys.push_back(entry.first);
+        for (const auto& row : *rows)
+            keys.push_back(row.key);
         return keys;
     });
     return b;

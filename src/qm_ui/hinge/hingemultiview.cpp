@@ -50,6 +50,10 @@ bool Entered(const P& p)
 {
     return !p.Curve().autoYield;
 }
+bool ShowsYield(const P& p)
+{
+    return IsYieldShown(p.Curve(), p.dlg.Calculated(p.end));
+}
 bool Deformation(const P& p)
 {
     return p.Curve().useDeformation;
@@ -65,6 +69,14 @@ bool Tri(const P& p)
 bool Bi(const P& p)
 {
     return !p.Tri();
+}
+bool BiYield(const P& p)
+{
+    return Bi(p) && ShowsYield(p);
+}
+bool TriYield(const P& p)
+{
+    return Tri(p) && ShowsYield(p);
 }
 /// The second point of a bilinear curve: its strength counts with its deformation, or below P3.
 bool Second(const P& p)
@@ -101,9 +113,9 @@ constexpr TEXTS kStiffness = Both("IDS_QM_UI_HINGE_USER_STIFFNESS");
 
 // clang-format off
 constexpr T_ROW kRows[] = {
-    {"P1",     &SIDE::P1,     KIND::Strength, kYield,    Bi,  Entered},
-    {"P1",     &SIDE::P1,     KIND::Strength, kCrack,    Tri, Entered},
-    {"P2",     &SIDE::P2,     KIND::Strength, kYield,    Tri, Entered},
+    {"P1",     &SIDE::P1,     KIND::Strength, kYield,    BiYield,  Entered},
+    {"P1",     &SIDE::P1,     KIND::Strength, kCrack,    Tri, Always},
+    {"P2",     &SIDE::P2,     KIND::Strength, kYield,    TriYield, Entered},
     {"P2",     &SIDE::P2,     KIND::Strength, kSecond,   Bi,  Second},
     {"P3",     &SIDE::P3,     KIND::Strength, kUltimate, Always, Ultimate},
     {"D1",     &SIDE::D1,     KIND::Deform,   Both("IDS_QM_UI_HINGE_D1"), Deformation, Always},
@@ -155,6 +167,7 @@ void AddTable(CFormView& form, const P& p)
     {
         return p.Curve().sides;
     };
+    AddByElementNote(form, [p] { return ShowsYield(p); });
     form.Cells({{}, PlainLabel("(+)"), PlainLabel("(-)")});
     for (const T_ROW& row : kRows)
         AddSideRow(form,
