@@ -6,6 +6,7 @@
 #include <QDir>
 #include <QFileInfo>
 #include <QLocale>
+#include <QMenuBar>
 #include <QSlider>
 
 using namespace desktop_test;
@@ -164,4 +165,22 @@ TEST_F(MainWindow, AFileThatCanNotBeWrittenIsToldAndTheEditsStay)
         EXPECT_TRUE(answers.m_texts.value(0).contains(name)) << name;
         EXPECT_TRUE(m_main->Doc().Data().IsModified()) << name;
     }
+}
+
+TEST_F(MainWindow, TheGuideHasEveryMenuOfToolsAndDeniesNone)
+{
+    QFile file(QM_PROJECT "/docs/user-guide.md");
+    ASSERT_TRUE(file.open(QIODevice::ReadOnly));
+    const QString guide = QString::fromUtf8(file.readAll());
+    const QString limits = guide.section("\n## Known limits\n", 1).section("\n## ", 0, 0);
+    ASSERT_GT(limits.size(), 100);
+    int tools = 0;
+    for (const QAction* menu : m_main->menuBar()->actions()) {
+        const QString name = menu->text().remove('&');
+        if (QStringList{"File", "Edit", "View", "Language"}.contains(name)) continue;
+        ++tools;
+        EXPECT_TRUE(guide.contains("\n| " + name + " | ")) << name.toStdString();
+        EXPECT_FALSE(limits.contains("no windows for " + name, Qt::CaseInsensitive));
+    }
+    EXPECT_GE(tools, 4);
 }
