@@ -2,9 +2,9 @@
 #include "hingetools.h"
 #include "qm_base/say.h"
 #include "qm_rps/hinge/axialforcelist.h"
+#include "qm_rps/hinge/hingecontext.h"
 #include "qm_rps/hinge/hingemirror.h"
 #include "qm_rps/hinge/hingetable.h"
-#include "qm_rps/hinge/sectionstrength.h"
 #include "qm_rps/po_hingeskcvtabfemadlg.h"
 
 #ifdef QM_UI
@@ -114,18 +114,18 @@ EXIT_CODE RunHingePlot(const T_HINGE_OPTIONS& o)
 #ifdef QM_UI
     T_PLOT plot;
     if (o.interaction) {
-        T_SECT_D section;
-        T_MATL_D material;
-        T_SECTION_STRENGTH strength;
-        SECT_FAULT fault{};
+        const auto sources = HingeContextOf(doc).sources;
+        const auto* result = sources->Strength(type.section, type.sectionMaterial);
         if (type.yieldSurface) {
             plot = HingeInteractionPlot(type, type.yieldSurface->yield,
                                         Say("IDS_QM_CLI_HINGE_LEVEL_ENTERED"));
-        } else if (doc.Attr().GetSect(type.section, section) &&
-                   doc.Attr().GetMatl(type.sectionMaterial, material) &&
-                   CSectionStrength::Calc(section, material, strength, fault)) {
-            plot = HingeInteractionPlot(type, strength.level,
-                                        Say("IDS_QM_CLI_HINGE_LEVEL_SECTION", section.name));
+        } else if (result && result->fault == SECT_FAULT::None) {
+            const std::string& section = sources->Section(type.section)->name;
+            plot = HingeInteractionPlot(type, result->strength.level,
+                                        Say("IDS_QM_CLI_HINGE_LEVEL_SECTION", section),
+                                        sources->Lines(type.section, type.sectionMaterial));
+        } else if (result) {
+            return Complain(EXIT_CODE::Usage, o.file + ": " + Say(MessageKeyOf(result->fault)));
         } else {
             return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_NO_SURFACE", o.file, o.type));
         }

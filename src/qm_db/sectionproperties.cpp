@@ -93,9 +93,9 @@ double Torsion(const T_SECT_D& s)
     return s.J;
 }
 
-/// Shear areas. Rectangle 5/6 A and circle 9/10 A: energy of the parabolic shear stress
-/// (Timoshenko, Strength of Materials I). Pipe A/2: thin wall. Box: two webs or two flanges over
-/// the full outside. I: web over the full height; flanges as rectangles.
+/// Shear areas of stiffness. Rectangle 5/6 A and circle 9/10 A: energy of the parabolic shear
+/// stress (Timoshenko, Strength of Materials I). Pipe A/2: thin wall. Box: two webs or two flanges
+/// over the full outside. I: web over the full height; flanges as rectangles.
 void ShearAreas(T_SECT_D& s)
 {
     const auto& [a, b, c, d] = s.size;
@@ -141,6 +141,8 @@ const char* MessageKeyOf(SECT_FAULT fault)
         return "IDS_QM_SECT_SHAPE";
     case SECT_FAULT::NoBars:
         return "IDS_CMD_IEHP_NO_RBAR";
+    case SECT_FAULT::ConcreteClass:
+        return "IDS_QM_SECT_CONCRETE_CLASS";
     case SECT_FAULT::Bars:
         return "IDS_QM_SECT_BARS";
     case SECT_FAULT::NotConverged:
@@ -168,6 +170,30 @@ int CSectionProperties::Calc(const T_SECT_D& in, T_SECT_D& out, SECT_FAULT& faul
     }
     out = s;
     return 1;
+}
+
+T_SHEAR_AREAS CSectionProperties::StrengthShearAreas(const T_SECT_D& section)
+{
+    const auto& [a, b, c, d] = section.size;
+    switch (section.shape) {
+    case SECT_SHAPE::Rectangle:
+        return {2.0 / 3.0 * section.area, 2.0 / 3.0 * section.area};
+    case SECT_SHAPE::Circle:
+        return {0.75 * section.area, 0.75 * section.area};
+    case SECT_SHAPE::Pipe:
+        return {2.0 / pi * section.area, 2.0 / pi * section.area};
+    case SECT_SHAPE::Box: {
+        const double webs = 2.0 * (a - 2.0 * d) * c;
+        return {section.area - webs, webs};
+    }
+    case SECT_SHAPE::IShape: {
+        const double web = (a - 2.0 * d) * c;
+        return {section.area - web, web};
+    }
+    case SECT_SHAPE::Value:
+        break;
+    }
+    return {section.Asy, section.Asz};
 }
 
 std::vector<T_SECT_PIECE> CSectionProperties::Pieces(const T_SECT_D& section, bool aboutY)

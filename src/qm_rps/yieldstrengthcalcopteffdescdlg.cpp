@@ -51,6 +51,9 @@ CYieldStrengthCalcOptEffDescDlg::CYieldStrengthCalcOptEffDescDlg(CDBDoc& doc,
         row.factors = {s.factorsI, s.factorsJ};
         row.effective = {Effective(s, s.factorsI), Effective(s, s.factorsJ)};
         row.plasticModuli = {s.Zy, s.Zz};
+        if (!found.material || found.material->type != MATL_CLASS::Steel) continue;
+        const T_SHEAR_AREAS areas = CSectionProperties::StrengthShearAreas(s);
+        row.shearAreas = {areas.y, areas.z};
     }
 }
 
@@ -63,6 +66,8 @@ std::vector<std::string> CYieldStrengthCalcOptEffDescDlg::Heads() const
             heads.push_back(HingeHead(std::string(p.symbol) + end, p.dim, m_units));
     for (const char* symbol : {"Zy", "Zz"})
         heads.push_back(HingeHead(symbol, {0, 3}, m_units));
+    for (const char* symbol : {"Avy", "Avz"})
+        heads.push_back(HingeHead(symbol, {0, 2}, m_units));
     return heads;
 }
 
@@ -81,5 +86,7 @@ std::vector<std::string> CYieldStrengthCalcOptEffDescDlg::Cells(std::size_t row)
             cells.push_back(ShortestText(end.*p.value));
     for (const double z : r.plasticModuli)
         cells.push_back(ShortestText(z));
+    for (const double area : r.shearAreas)
+        cells.push_back(area > 0.0 ? ShortestText(area) : std::string());
     return cells;
 }

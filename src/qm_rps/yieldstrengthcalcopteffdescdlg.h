@@ -15,7 +15,9 @@ public:
         T_ENDS<T_SECT_FACTORS> factors;        // as the section has them
         T_ENDS<T_SECT_FACTORS> effective;      // property times factor
         std::array<double, 2> plasticModuli{}; // Zy, Zz, without factors
-        const char* faultKey = "";             // IDS_CMD_IEHP_NO_SECT, or the section's fault
+        /// Avy, Avz of the strength of steel, without factors; 0 for other materials.
+        std::array<double, 2> shearAreas{};
+        const char* faultKey = ""; // IDS_CMD_IEHP_NO_SECT, or the section's fault
         bool operator==(const T_ROW&) const = default;
     };
 

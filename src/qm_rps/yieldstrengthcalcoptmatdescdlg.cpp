@@ -5,6 +5,8 @@
 #include "qm_rps/hinge/hingelabels.h"
 #include "qm_rps/hinge/hingetable.h"
 
+#include <algorithm>
+
 CYieldStrengthCalcOptMatDescDlg::CYieldStrengthCalcOptMatDescDlg(CDBDoc& doc,
                                                                  const std::vector<int>& elements)
     : m_units(doc.Unit().Units())
@@ -23,6 +25,9 @@ CYieldStrengthCalcOptMatDescDlg::CYieldStrengthCalcOptMatDescDlg(CDBDoc& doc,
         const bool bars = m.type == MATL_CLASS::Concrete || m.type == MATL_CLASS::Composite;
         if (m.type == MATL_CLASS::Steel || m.type == MATL_CLASS::Composite) row.Fy = m.Fy;
         if (m.type != MATL_CLASS::Steel) row.fck = m.fck;
+        const double fckMpa = ToSi(m.fck, m_units, kDimStress) / 1e6;
+        if (bars && fckMpa <= kMaxFckMpa * (1.0 + 1e-9))
+            row.law = ConcreteLaw(std::min(fckMpa, kMaxFckMpa));
         if (bars) row.fyk = m.fyk, row.Es = m.Es;
     }
 }
@@ -33,6 +38,8 @@ std::vector<std::string> CYieldStrengthCalcOptMatDescDlg::Heads() const
                                    HingeHead("IDS_QM_UI_HINGE_MATERIAL", kDimNone, m_units)};
     for (const char* symbol : {"Fy", "fck", "fyk", "E", "Es"})
         heads.push_back(HingeHead(symbol, kDimStress, m_units));
+    for (const char* symbol : {"n", "eps_c2", "eps_cu2"})
+        heads.push_back(symbol);
     return heads;
 }
 
@@ -45,5 +52,8 @@ std::vector<std::string> CYieldStrengthCalcOptMatDescDlg::Cells(std::size_t row)
                                        : r.material};
     for (const std::optional<double>& v : {r.Fy, r.fck, r.fyk, r.E, r.Es})
         cells.push_back(v ? ShortestText(*v) : std::string());
+    const T_CONCRETE_LAW law = r.law.value_or(T_CONCRETE_LAW{});
+    for (const double v : {law.n, law.peakStrain, law.crushStrain})
+        cells.push_back(r.law ? FormatText("%.4g", v) : std::string());
     return cells;
 }

@@ -4,6 +4,7 @@
 
 #include "qm_base/mdialog.h"
 #include "qm_db/dbdoc.h"
+#include "qm_rps/hinge/sectionbending.h"
 
 #include <optional>
 
@@ -19,7 +20,9 @@ public:
         std::optional<double> fck;   // concrete and masonry
         std::optional<double> fyk;   // bars
         std::optional<double> E, Es; // elastic moduli of the material and of the bars
-        const char* faultKey = "";   // IDS_CMD_IEHP_NO_MATL
+        /// Law of concrete; empty for other materials and above C90.
+        std::optional<T_CONCRETE_LAW> law{};
+        const char* faultKey = ""; // IDS_CMD_IEHP_NO_MATL
         bool operator==(const T_ROW&) const = default;
     };
 

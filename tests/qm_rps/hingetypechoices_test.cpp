@@ -19,8 +19,9 @@ T_HINGE_CONTEXT Context()
     T_MATL_D m;
     m.E = 260, m.nu = 0.3; // G = 100
     T_HINGE_CONTEXT x;
-    x.sources = std::make_shared<CHingeSources>(
-        T_TABLE<T_SECT_D>{{1, values}, {4, wall}, {7, circle}}, T_TABLE<T_MATL_D>{{1, m}});
+    x.sources =
+        std::make_shared<CHingeSources>(T_TABLE<T_SECT_D>{{1, values}, {4, wall}, {7, circle}},
+                                        T_TABLE<T_MATL_D>{{1, m}}, T_UNITS());
     return x;
 }
 

@@ -16,6 +16,7 @@ T_HINGE_CONTEXT HingeContextOf(CDBDoc& doc)
     T_TABLE<T_MATL_D> materials = model.materials;
     for (auto& [key, material] : materials)
         RecordFromSi(material, model.styp.units);
-    context.sources = std::make_shared<CHingeSources>(std::move(sections), std::move(materials));
+    context.sources = std::make_shared<CHingeSources>(std::move(sections), std::move(materials),
+                                                      model.styp.units);
     return context;
 }

@@ -28,6 +28,23 @@ const CHingeSources::T_RESULT* CHingeSources::Strength(int section, int material
     if (!s || !m) return nullptr;
     const auto [at, fresh] = m_results.try_emplace({section, material});
     T_RESULT& r = at->second;
-    if (fresh && !CSectionStrength::Calc(*s, *m, r.strength, r.fault)) r.strength = {};
+    if (fresh && !CSectionStrength::Calc(*s, *m, m_units, r.strength, r.fault)) r.strength = {};
     return &r;
+}
+
+T_PM_LINES CHingeSources::Lines(int section, int material) const
+{
+    T_PM_LINES lines;
+    const T_RESULT* result = Strength(section, material);
+    if (!result || result->fault != SECT_FAULT::None) return lines;
+    for (const bool aboutY : {true, false})
+        for (const bool positive : {true, false}) {
+            auto& sides = aboutY ? lines.y : lines.z;
+            SECT_FAULT fault{};
+            if (!CSectionStrength::CalcCurve(*Section(section), *Material(material), m_units,
+                                             aboutY, positive, positive ? sides.pos : sides.neg,
+                                             fault))
+                return {};
+        }
+    return lines;
 }

@@ -8,7 +8,12 @@
 #include <map>
 #include <utility>
 
-/// Values in one consistent unit system. A strength is calculated when it is first asked for and
+/// Interaction curves about y and z as lines of points.
+struct T_PM_LINES {
+    T_SIDES<std::vector<T_PM_POINT>> y, z;
+};
+
+/// Values in the units given. A strength is calculated when it is first asked for and
 /// kept, so one object serves one thread.
 class CHingeSources {
 public:
@@ -17,8 +22,8 @@ public:
         T_SECTION_STRENGTH strength;
     };
 
-    CHingeSources(T_TABLE<T_SECT_D> sections, T_TABLE<T_MATL_D> materials)
-        : m_sections(std::move(sections)), m_materials(std::move(materials))
+    CHingeSources(T_TABLE<T_SECT_D> sections, T_TABLE<T_MATL_D> materials, const T_UNITS& units)
+        : m_sections(std::move(sections)), m_materials(std::move(materials)), m_units(units)
     {
     }
 
@@ -30,6 +35,10 @@ public:
     /// Null where the section or the material is missing.
     const T_RESULT* Strength(int section, int material) const;
 
+    /// The whole interaction curves of the same pair, see CSectionStrength::CalcCurve. Empty where
+    /// the strengths can't be calculated.
+    T_PM_LINES Lines(int section, int material) const;
+
     /// True for a section whose fibres a frame can have: one with dimensions.
     static bool HasFibres(const T_SECT_D& section) { return section.shape != SECT_SHAPE::Value; }
     /// True for a section that a wall can have: a rectangle.
@@ -40,5 +49,6 @@ public:
 private:
     T_TABLE<T_SECT_D> m_sections;
     T_TABLE<T_MATL_D> m_materials;
+    T_UNITS m_units;
     mutable std::map<std::pair<int, int>, T_RESULT> m_results;
 };

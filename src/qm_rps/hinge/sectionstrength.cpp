@@ -2,7 +2,9 @@
 
 #include "qm_rps/hinge/sectionbending.h"
 
+#include <algorithm>
 #include <cmath>
+#include <functional>
 #include <numbers>
 
 namespace {
@@ -10,12 +12,18 @@ namespace {
 constexpr int kMaxIterations = 200;
 constexpr double kAxialTol = 1e-9; // residual of the axial force / range of axial forces
 constexpr int kScan = 64;          // steps of the search for the largest moment
-/// Way of the points A to E from the largest moment to the end of the curve.
-constexpr std::array<double, 5> kWay{0.05, 0.25, 0.5, 0.75, 1.0};
+/// Way of the points A to E from the largest moment to pure compression and to pure tension.
+constexpr std::array<double, 5> kWayC{0.0, 0.25, 0.5, 0.75, 1.0};
+constexpr std::array<double, 5> kWayT{0.05, 0.25, 0.5, 0.75, 1.0};
 
 bool Positive(double v)
 {
     return v > 0.0 && std::isfinite(v);
+}
+
+double FckMpa(const T_MATL_D& m, const T_UNITS& units)
+{
+    return ToSi(m.fck, units, kDimStress) / 1e6;
 }
 
 /// u of an axial force between the forces at lo and hi, by bisection.
@@ -69,14 +77,15 @@ bool Solve(const ISectionBending& bending, T_DIRECTION& out)
     const double pure = bending.At(2.0).axial, tension = bending.At(0.0).axial;
     if (!Positive(out.atZero) || !Positive(out.largest)) return false;
     if (!(tension < top.axial && top.axial < pure)) return false;
-    for (std::size_t i = 0; i < kWay.size(); ++i) {
-        const double c = top.axial + kWay[i] * (pure - top.axial);
-        const double t = top.axial + kWay[i] * (tension - top.axial);
+    for (std::size_t i = 0; i < kWayC.size(); ++i) {
+        const double c = top.axial + kWayC[i] * (pure - top.axial);
+        const double t = top.axial + kWayT[i] * (tension - top.axial);
         double uc = 2.0, ut = 0.0;
-        if (i + 1 < kWay.size() &&
+        if (i + 1 < kWayC.size() &&
             (!FindAxial(bending, c, peak, 2.0, uc) || !FindAxial(bending, t, 0.0, peak, ut)))
             return false;
-        out.curve[4 - i] = {c / pure, bending.At(uc).moment / out.largest};
+        const double ratio = bending.At(uc).moment / out.largest;
+        out.curve[4 - i] = {c / pure, i == 0 ? CSectionStrength::kLargestRatio : ratio};
         out.curve[5 + i] = {t / pure, bending.At(ut).moment / out.largest};
     }
     return true;
@@ -96,10 +105,12 @@ SECT_FAULT CheckBars(const T_SECT_D& s)
     return steel < s.area ? SECT_FAULT::None : SECT_FAULT::Bars;
 }
 
-SECT_FAULT CheckConcrete(const T_SECT_D& s, const T_MATL_D& m)
+SECT_FAULT CheckConcrete(const T_SECT_D& s, const T_MATL_D& m, const T_UNITS& units)
 {
     if (s.shape != SECT_SHAPE::Rectangle && s.shape != SECT_SHAPE::Circle) return SECT_FAULT::Shape;
     if (!Positive(m.fck) || !Positive(m.fyk) || !Positive(m.Es)) return SECT_FAULT::Material;
+    // fck in another unit system may miss 90 by a rounding.
+    if (FckMpa(m, units) > kMaxFckMpa * (1.0 + 1e-9)) return SECT_FAULT::ConcreteClass;
     return CheckBars(s);
 }
 
@@ -112,31 +123,43 @@ SECT_FAULT CheckSteel(const T_SECT_D& s, const T_MATL_D& m)
 }
 
 /// The section with its properties, when its strengths can be calculated.
-bool Prepare(const T_SECT_D& in, const T_MATL_D& m, T_SECT_D& section, SECT_FAULT& fault)
+bool Prepare(const T_SECT_D& in, const T_MATL_D& m, const T_UNITS& units, T_SECT_D& section,
+             SECT_FAULT& fault)
 {
     if (!CSectionProperties::Calc(in, section, fault)) return false;
     if (m.type == MATL_CLASS::Steel)
         fault = CheckSteel(section, m);
     else if (m.type == MATL_CLASS::Concrete)
-        fault = CheckConcrete(section, m);
+        fault = CheckConcrete(section, m, units);
     else
         fault = SECT_FAULT::Class;
     return fault == SECT_FAULT::None;
 }
 
-std::unique_ptr<ISectionBending> MakeBending(const T_SECT_D& s, const T_MATL_D& m, bool aboutY,
-                                             bool positive)
-{
-    // A steel section is symmetric: (+) and (-) are the same.
-    return m.type == MATL_CLASS::Steel ? MakeSteelBending(s, m.Fy, aboutY)
-                                       : MakeConcreteBending(s, m, aboutY, positive);
-}
+/// A section that its strengths can be calculated of, and how it bends.
+struct T_READY {
+    const T_SECT_D& section;
+    const T_MATL_D& material;
+    T_CONCRETE_LAW law{}; // of concrete
+    T_READY(const T_SECT_D& s, const T_MATL_D& m, const T_UNITS& units) : section(s), material(m)
+    {
+        if (m.type == MATL_CLASS::Concrete)
+            law = ConcreteLaw(std::min(FckMpa(m, units), kMaxFckMpa));
+    }
+    std::unique_ptr<ISectionBending> Bending(bool aboutY, bool positive) const
+    {
+        // A steel section is symmetric: (+) and (-) are the same.
+        return material.type == MATL_CLASS::Steel
+                   ? MakeSteelBending(section, material.Fy, aboutY)
+                   : MakeConcreteBending(section, material, law, aboutY, positive);
+    }
+};
 
-bool SolveAxis(const T_SECT_D& s, const T_MATL_D& m, bool aboutY, T_YIELD_AXIS& axis)
+bool SolveAxis(const T_READY& ready, bool aboutY, T_YIELD_AXIS& axis)
 {
     T_DIRECTION pos, neg;
-    if (!Solve(*MakeBending(s, m, aboutY, true), pos)) return false;
-    if (!Solve(*MakeBending(s, m, aboutY, false), neg)) return false;
+    if (!Solve(*ready.Bending(aboutY, true), pos)) return false;
+    if (!Solve(*ready.Bending(aboutY, false), neg)) return false;
     axis = {true, {pos.atZero, neg.atZero}, {pos.largest, neg.largest}, {pos.curve, neg.curve}};
     return true;
 }
@@ -148,16 +171,17 @@ std::optional<T_SIDES<double>> Both(double v)
 
 } // namespace
 
-int CSectionStrength::Calc(const T_SECT_D& section, const T_MATL_D& material,
+int CSectionStrength::Calc(const T_SECT_D& section, const T_MATL_D& material, const T_UNITS& units,
                            T_SECTION_STRENGTH& out, SECT_FAULT& fault)
 {
     T_SECT_D s;
-    if (!Prepare(section, material, s, fault)) return 0;
+    if (!Prepare(section, material, units, s, fault)) return 0;
     T_SECTION_STRENGTH r;
-    const auto axial = MakeBending(s, material, true, true);
+    const T_READY ready(s, material, units);
+    const auto axial = ready.Bending(true, true);
     r.level.compression = axial->At(2.0).axial;
     r.level.tension = -axial->At(0.0).axial;
-    if (!SolveAxis(s, material, true, r.level.y) || !SolveAxis(s, material, false, r.level.z)) {
+    if (!SolveAxis(ready, true, r.level.y) || !SolveAxis(ready, false, r.level.z)) {
         fault = SECT_FAULT::NotConverged;
         return 0;
     }
@@ -170,19 +194,21 @@ int CSectionStrength::Calc(const T_SECT_D& section, const T_MATL_D& material,
     at(HINGE_COMPONENT::Mz) = r.level.z.moment;
     if (material.type == MATL_CLASS::Steel) {
         const double shear = material.Fy / std::numbers::sqrt3; // von Mises
-        at(HINGE_COMPONENT::Fy) = Both(s.Asy * shear);
-        at(HINGE_COMPONENT::Fz) = Both(s.Asz * shear);
+        const T_SHEAR_AREAS areas = CSectionProperties::StrengthShearAreas(s);
+        at(HINGE_COMPONENT::Fy) = Both(areas.y * shear);
+        at(HINGE_COMPONENT::Fz) = Both(areas.z * shear);
     }
     out = r;
     return 1;
 }
 
-int CSectionStrength::CalcMoment(const T_SECT_D& section, const T_MATL_D& material, bool aboutY,
-                                 bool positive, double axial, double& moment, SECT_FAULT& fault)
+int CSectionStrength::CalcMoment(const T_SECT_D& section, const T_MATL_D& material,
+                                 const T_UNITS& units, bool aboutY, bool positive, double axial,
+                                 double& moment, SECT_FAULT& fault)
 {
     T_SECT_D s;
-    if (!Prepare(section, material, s, fault)) return 0;
-    const auto bending = MakeBending(s, material, aboutY, positive);
+    if (!Prepare(section, material, units, s, fault)) return 0;
+    const auto bending = T_READY(s, material, units).Bending(aboutY, positive);
     if (!(bending->At(0.0).axial <= axial && axial <= bending->At(2.0).axial)) {
         fault = SECT_FAULT::Values;
         return 0;
@@ -193,5 +219,31 @@ int CSectionStrength::CalcMoment(const T_SECT_D& section, const T_MATL_D& materi
         return 0;
     }
     moment = bending->At(u).moment;
+    return 1;
+}
+
+int CSectionStrength::CalcCurve(const T_SECT_D& section, const T_MATL_D& material,
+                                const T_UNITS& units, bool aboutY, bool positive,
+                                std::vector<T_PM_POINT>& out, SECT_FAULT& fault)
+{
+    T_SECT_D s;
+    if (!Prepare(section, material, units, s, fault)) return 0;
+    const auto bending = T_READY(s, material, units).Bending(aboutY, positive);
+    const double pure = bending->At(2.0).axial, peak = FindPeak(*bending);
+    const double largest = bending->At(peak).moment;
+    if (!Positive(pure) || !Positive(largest)) {
+        fault = SECT_FAULT::NotConverged;
+        return 0;
+    }
+    std::vector<double> places{peak};
+    for (int i = 0; i <= kScan; ++i)
+        places.push_back(2.0 * i / kScan);
+    std::ranges::sort(places, std::greater());
+    std::vector<T_PM_POINT> curve;
+    for (const double u : places) {
+        const T_AXIAL_MOMENT at = bending->At(u);
+        curve.push_back({at.axial / pure, at.moment / largest});
+    }
+    out = std::move(curve);
     return 1;
 }

@@ -2,10 +2,12 @@
 #pragma once
 
 #include "qm_db/records.h"
+#include "qm_db/records/units.h"
 #include "qm_db/sectionproperties.h"
 
 #include <array>
 #include <optional>
+#include <vector>
 
 /// What CSectionStrength finds. All values are magnitudes, in the units of the input.
 /// The (+) moments compress the side +z (My) or +y (Mz); Fx (+) is tension, (-) compression.
@@ -20,34 +22,43 @@ struct T_SECTION_STRENGTH {
 /// axes; moments refer to the centroid of the gross section.
 ///
 /// Steel (any shape): full plasticity with fy in tension and compression, Fx = A fy, shear
-/// As fy / sqrt(3), moments Z fy. The interaction is exact for the shape: the plastic neutral axis
-/// at +-a gives P = fy (area within a) and M = fy (first moment beyond a). A section given by
-/// values has no shape; its interaction is the straight line M = Z fy (1 - P / A fy), a lower bound
-/// for every section that is symmetric about both axes.
+/// Av fy / sqrt(3) (CSectionProperties::StrengthShearAreas), moments Z fy. The interaction is exact
+/// for the shape: the plastic neutral axis at +-a gives P = fy (area within a) and M = fy (first
+/// moment beyond a). A section given by values has no shape; its interaction is the straight line M
+/// = Z fy (1 - P / A fy), a lower bound for every section that is symmetric about both axes.
 ///
 /// Concrete (rectangle, circle, with bars): plane sections; parabola-rectangle of EN 1992-1-1
-/// 3.1.7 for fck <= 50 MPa (peak fck at 0.002, alpha_cc = 1, crushing at 0.0035); bars
-/// elastic-perfectly plastic without a strain limit; no concrete in tension; the concrete that a
-/// bar in compression displaces is taken off (bar stress minus concrete stress). Strains as in
-/// EN 1992-1-1 6.1: 0.0035 at the edge while the neutral axis cuts the section, then turning about
-/// 0.002 at 3/7 of the depth down to a uniform 0.002. So the compressive strength has the bars at
-/// min(fyk, 0.002 Es).
+/// 3.1.7 (ConcreteLaw, up to C90; alpha_cc = 1); bars elastic-perfectly plastic without a strain
+/// limit; no concrete in tension; the concrete that a bar in compression displaces is taken off
+/// (bar stress minus concrete stress). Strains as in EN 1992-1-1 6.1: eps_cu2 at the edge while the
+/// neutral axis cuts the section, then turning about eps_c2 at 1 - eps_c2 / eps_cu2 of the depth
+/// down to a uniform eps_c2. So the compressive strength has the bars at min(fyk, eps_c2 Es).
 ///
-/// Ten points: E(c), D(c), C(c), B(c), A(c) lie at 100, 75, 50, 25 and 5 % of the way from the
-/// axial force of the largest moment to pure compression; A(t) to E(t) at 5 ... 100 % of the way to
-/// pure tension. Compression is positive. The largest moment itself is (its P, 1) and not among the
-/// ten.
+/// Ten points: E(c), D(c), C(c), B(c), A(c) lie at 100, 75, 50, 25 and 0 % of the way from the
+/// axial force of the largest moment to pure compression, so that A(c) is the largest moment; A(t)
+/// to E(t) at 5, 25 ... 100 % of the way to pure tension. Compression is positive. The rules of a
+/// yield surface want every ratio below 1: that of the largest moment is kLargestRatio.
 /// Where the largest moment lies beyond pure compression (one heavy bar far off the centroid) the
 /// points can't fall, and the section is refused as NotConverged.
 class CSectionStrength {
 public:
+    static constexpr double kLargestRatio = 1.0 - 1e-9;
+
+    /// The units are those of the input; the law of concrete hangs on fck in MPa.
     /// 1 done; 0 with the fault, `out` unchanged.
     [[nodiscard]] static int Calc(const T_SECT_D& section, const T_MATL_D& material,
-                                  T_SECTION_STRENGTH& out, SECT_FAULT& fault);
+                                  const T_UNITS& units, T_SECTION_STRENGTH& out, SECT_FAULT& fault);
 
     /// Moment capacity at an axial force (compression positive, within the axial strengths), about
     /// y or z, (+) or (-). 1 done; 0 with the fault (Values: P out of range), `moment` unchanged.
     [[nodiscard]] static int CalcMoment(const T_SECT_D& section, const T_MATL_D& material,
-                                        bool aboutY, bool positive, double axial, double& moment,
-                                        SECT_FAULT& fault);
+                                        const T_UNITS& units, bool aboutY, bool positive,
+                                        double axial, double& moment, SECT_FAULT& fault);
+
+    /// The whole curve about y or z, (+) or (-), from pure compression to pure tension: the points
+    /// P / Pmax and M / largest moment that the ten points stand on. 1 done; 0 with the fault,
+    /// `out` unchanged.
+    [[nodiscard]] static int CalcCurve(const T_SECT_D& section, const T_MATL_D& material,
+                                       const T_UNITS& units, bool aboutY, bool positive,
+                                       std::vector<T_PM_POINT>& out, SECT_FAULT& fault);
 };

@@ -4,6 +4,7 @@
 #include "qm_rps/hinge/hingepreview.h"
 
 #include <array>
+#include <span>
 
 using zql::lib::MMSGFunction;
 
@@ -16,14 +17,28 @@ struct T_CURVE_ROW {
     const T_YIELD_AXIS T_YIELD_LEVEL::*axis;
     const T_PM_CURVE T_SIDES<T_PM_CURVE>::*side;
     PLOT_LINE line;
+    const T_SIDES<std::vector<T_PM_POINT>> T_PM_LINES::*lines;
+    const std::vector<T_PM_POINT> T_SIDES<std::vector<T_PM_POINT>>::*whole;
 };
 
 constexpr std::array<T_CURVE_ROW, 4> kCurves{{
-    {"My(+)", &T_YIELD_LEVEL::y, &T_SIDES<T_PM_CURVE>::pos, PLOT_LINE::Solid},
-    {"My(-)", &T_YIELD_LEVEL::y, &T_SIDES<T_PM_CURVE>::neg, PLOT_LINE::Dash},
-    {"Mz(+)", &T_YIELD_LEVEL::z, &T_SIDES<T_PM_CURVE>::pos, PLOT_LINE::DashDot},
-    {"Mz(-)", &T_YIELD_LEVEL::z, &T_SIDES<T_PM_CURVE>::neg, PLOT_LINE::Dot},
+    {"My(+)", &T_YIELD_LEVEL::y, &T_SIDES<T_PM_CURVE>::pos, PLOT_LINE::Solid, &T_PM_LINES::y,
+     &T_SIDES<std::vector<T_PM_POINT>>::pos},
+    {"My(-)", &T_YIELD_LEVEL::y, &T_SIDES<T_PM_CURVE>::neg, PLOT_LINE::Dash, &T_PM_LINES::y,
+     &T_SIDES<std::vector<T_PM_POINT>>::neg},
+    {"Mz(+)", &T_YIELD_LEVEL::z, &T_SIDES<T_PM_CURVE>::pos, PLOT_LINE::DashDot, &T_PM_LINES::z,
+     &T_SIDES<std::vector<T_PM_POINT>>::pos},
+    {"Mz(-)", &T_YIELD_LEVEL::z, &T_SIDES<T_PM_CURVE>::neg, PLOT_LINE::Dot, &T_PM_LINES::z,
+     &T_SIDES<std::vector<T_PM_POINT>>::neg},
 }};
+
+void Append(std::span<const T_PM_POINT> points, T_PLOT_SERIES& s)
+{
+    for (const T_PM_POINT& p : points) {
+        s.x.push_back(p.m);
+        s.y.push_back(p.p);
+    }
+}
 
 } // namespace
 
@@ -74,26 +89,30 @@ T_PLOT HingeBackbonePlot(const T_PHGT_D& type, HINGE_COMPONENT component, const 
 }
 
 T_PLOT HingeInteractionPlot(const T_PHGT_D& type, const T_YIELD_LEVEL& level,
-                            const std::string& what)
+                            const std::string& what, const T_PM_LINES& lines)
 {
     T_PLOT plot;
     plot.title = MMSGFunction::Format("IDS_QM_PLOT_INTERACTION", {type.name});
     plot.subtitle = what;
     plot.x.title = "M / MY,max (-)";
     plot.y.title = MMSGFunction::GetValue("IDS_QM_PLOT_AXIAL_RATIO");
+    T_PLOT_SERIES points; // on whole lines
+    points.name = MMSGFunction::GetValue("IDS_QM_PLOT_INTERACTION_POINTS");
+    points.line = PLOT_LINE::None;
+    points.marker = PLOT_MARKER::Circle;
     for (const T_CURVE_ROW& row : kCurves) {
         const T_YIELD_AXIS& axis = level.*row.axis;
         if (!axis.used) continue;
         T_PLOT_SERIES s;
         s.name = row.name;
         s.line = row.line;
-        s.marker = PLOT_MARKER::Circle;
-        for (const T_PM_POINT& p : axis.curves.*row.side) {
-            s.x.push_back(p.m);
-            s.y.push_back(p.p);
-        }
+        const std::vector<T_PM_POINT>& whole = lines.*row.lines.*row.whole;
+        if (whole.empty()) s.marker = PLOT_MARKER::Circle;
+        Append(axis.curves.*row.side, whole.empty() ? s : points);
+        Append(whole, s);
         plot.series.push_back(std::move(s));
     }
+    if (!points.x.empty()) plot.series.push_back(std::move(points));
     return plot;
 }
 
@@ -108,10 +127,7 @@ T_PLOT UserInteractionPlot(const T_PHGT_D& type, const T_PMM_TABLE& table)
         s.name = i == 0 ? "Py-My" : "Pz-Mz";
         s.line = i == 0 ? PLOT_LINE::Solid : PLOT_LINE::Dash;
         s.marker = PLOT_MARKER::Circle;
-        for (const T_PM_POINT& p : table.curves[i]) {
-            s.x.push_back(p.m);
-            s.y.push_back(p.p);
-        }
+        Append(table.curves[i], s);
         plot.series.push_back(std::move(s));
     }
     return plot;

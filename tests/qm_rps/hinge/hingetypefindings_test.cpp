@@ -34,7 +34,8 @@ T_HINGE_CONTEXT Context()
     x.steelCode = "Eurocode3";
     x.sources = std::make_shared<CHingeSources>(
         T_TABLE<T_SECT_D>{{1, values}, {2, wall}, {3, circle}, {4, column}},
-        T_TABLE<T_MATL_D>{{1, steel}, {2, concrete}, {3, masonry}});
+        T_TABLE<T_MATL_D>{{1, steel}, {2, concrete}, {3, masonry}},
+        T_UNITS{FORCE_UNIT::N, LENGTH_UNIT::mm});
     return x;
 }
 
