@@ -2,7 +2,6 @@
 #pragma once
 
 #include "qm_db/records.h"
-#include "qm_db/records/units.h"
 #include "qm_db/sectionproperties.h"
 
 #include <array>
