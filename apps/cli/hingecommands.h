@@ -3,6 +3,7 @@
 
 #include "exitcodes.h"
 
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -16,7 +17,13 @@ struct T_HINGE_OPTIONS {
     std::string out;                         // file to write: .json, .qmdb or a picture
     bool overwrite = false;                  // a file that is there
     bool interaction = false;                // plot: interaction instead of the backbone
+    bool values = false;                     // interaction: forces and moments, not ratios
+    bool box = false;                        // backbone: the small preview
     std::vector<double> add, remove, change; // axial forces; change: old and new
+    // Options of the model: what is to be changed.
+    std::optional<std::string> concreteCode, steelCode;
+    std::string alternative, wallDegradation, gsd; // "on", "off"; empty: as it is
+    std::vector<double> alpha1, alpha2;            // (+), (-)
 };
 
 EXIT_CODE RunHingeList(const T_HINGE_OPTIONS& options);
@@ -31,6 +38,8 @@ EXIT_CODE RunHingeAssign(const T_HINGE_OPTIONS& options);
 EXIT_CODE RunHingeGenerated(const T_HINGE_OPTIONS& options);
 EXIT_CODE RunHingeConvert(const T_HINGE_OPTIONS& options);
 EXIT_CODE RunHingeAxial(const T_HINGE_OPTIONS& options);
+/// Prints options of hinges and design codes; with a file to write it changes them first.
+EXIT_CODE RunHingeModelOptions(const T_HINGE_OPTIONS& options);
 EXIT_CODE RunHingePlot(const T_HINGE_OPTIONS& options);
 
 /// Checks the pushover load cases and their pattern rows.

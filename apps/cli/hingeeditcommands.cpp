@@ -1,10 +1,13 @@
 // Commands that edit or draw a hinge type.
 #include "hingetools.h"
 #include "qm_base/say.h"
+#include "qm_base/textformat.h"
 #include "qm_rps/hinge/axialforcelist.h"
+#include "qm_rps/hinge/hingechoices.h"
 #include "qm_rps/hinge/hingecontext.h"
 #include "qm_rps/hinge/hingemirror.h"
 #include "qm_rps/hinge/hingetable.h"
+#include "qm_rps/hingeoptionsdlg.h"
 #include "qm_rps/po_hingeskcvtabfemadlg.h"
 
 #ifdef QM_UI
@@ -36,6 +39,35 @@ bool HasYieldDeform(const T_SKEL_FEMA& curve)
     };
     if (!curve.multiCurve) return has(curve.sides);
     return std::ranges::all_of(curve.curves, [&](const T_SKEL_AXIAL& a) { return has(a.sides); });
+}
+
+/// Takes what the arguments change. False: nothing.
+bool Edit(const T_HINGE_OPTIONS& o, CHingeOptionsDlg& options)
+{
+    bool any = false;
+    const auto flag = [&any](const std::string& word, bool& value) {
+        if (word.empty()) return;
+        value = word == "on";
+        any = true;
+    };
+    const auto code = [&any](const std::optional<std::string>& name, std::string& value) {
+        if (!name) return;
+        value = *name;
+        any = true;
+    };
+    const auto ratios = [&any](const std::vector<double>& given, std::array<double, 2>& values) {
+        if (given.size() != values.size()) return;
+        std::ranges::copy(given, values.begin());
+        any = true;
+    };
+    code(o.concreteCode, options.m_concreteCode);
+    code(o.steelCode, options.m_steelCode);
+    flag(o.alternative, options.m_alternativeHysteresis);
+    flag(o.wallDegradation, options.m_wallStrengthDegradation);
+    flag(o.gsd, options.m_gsd);
+    ratios(o.alpha1, options.m_alpha1);
+    ratios(o.alpha2, options.m_alpha2);
+    return any;
 }
 
 } // namespace
@@ -87,7 +119,8 @@ EXIT_CODE RunHingeAxial(const T_HINGE_OPTIONS& o)
                   : nullptr;
     auto* fema = curve ? std::get_if<T_SKEL_FEMA>(curve) : nullptr;
     if (!fema) return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_NO_FEMA", o.file));
-    CAxialForceList forces(fema->curves);
+    const auto sources = HingeContextOf(doc).sources;
+    CAxialForceList forces(fema->curves, sources->AxialRange(type.section, type.sectionMaterial));
     CAxialForceList::REFUSAL refusal;
     for (const double axial : o.add)
         if (!refusal) refusal = forces.Add(axial);
@@ -103,6 +136,29 @@ EXIT_CODE RunHingeAxial(const T_HINGE_OPTIONS& o)
     return StoreType(doc, key, type, o.out);
 }
 
+EXIT_CODE RunHingeModelOptions(const T_HINGE_OPTIONS& o)
+{
+    CDBDoc doc;
+    if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
+    CHingeOptionsDlg options(doc);
+    const bool edited = Edit(o, options);
+    if (edited != !o.out.empty())
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_OPTIONS_OUT"));
+    if (edited && !options.OnOK())
+        return Complain(EXIT_CODE::Usage, o.file + ": " + options.Messages().back().text);
+    const auto word = [](bool on) {
+        return Say(on ? "IDS_QM_CLI_HINGE_ON" : "IDS_QM_CLI_HINGE_OFF");
+    };
+    const auto ratio = [](double v) { return ShortestText(v); };
+    PrintLine(Say("IDS_QM_CLI_HINGE_CODES", options.m_concreteCode, options.m_steelCode));
+    PrintLine(options.ModeText());
+    PrintLine(Say("IDS_QM_CLI_HINGE_SWITCHES", word(options.m_alternativeHysteresis),
+                  word(options.m_wallStrengthDegradation), word(options.m_gsd)));
+    PrintLine(Say("IDS_QM_CLI_HINGE_ALPHAS", ratio(options.m_alpha1[0]), ratio(options.m_alpha1[1]),
+                  ratio(options.m_alpha2[0]), ratio(options.m_alpha2[1])));
+    return edited ? SaveDocument(doc, o.out) : EXIT_CODE::Done;
+}
+
 EXIT_CODE RunHingePlot(const T_HINGE_OPTIONS& o)
 {
     CDBDoc doc;
@@ -115,15 +171,18 @@ EXIT_CODE RunHingePlot(const T_HINGE_OPTIONS& o)
     T_PLOT plot;
     if (o.interaction) {
         const auto sources = HingeContextOf(doc).sources;
+        const auto units = o.values ? std::optional(doc.Unit().Units()) : std::nullopt;
         const auto* result = sources->Strength(type.section, type.sectionMaterial);
-        if (type.yieldSurface) {
+        if (type.pmm && HasUserInteraction(type)) {
+            plot = UserInteractionPlot(type, *type.pmm);
+        } else if (type.yieldSurface) {
             plot = HingeInteractionPlot(type, type.yieldSurface->yield,
-                                        Say("IDS_QM_CLI_HINGE_LEVEL_ENTERED"));
+                                        Say("IDS_QM_CLI_HINGE_LEVEL_ENTERED"), {}, units);
         } else if (result && result->fault == SECT_FAULT::None) {
             const std::string& section = sources->Section(type.section)->name;
             plot = HingeInteractionPlot(type, result->strength.level,
                                         Say("IDS_QM_CLI_HINGE_LEVEL_SECTION", section),
-                                        sources->Lines(type.section, type.sectionMaterial));
+                                        sources->Lines(type.section, type.sectionMaterial), units);
         } else if (result) {
             return Complain(EXIT_CODE::Usage, o.file + ": " + Say(MessageKeyOf(result->fault)));
         } else {
@@ -136,7 +195,7 @@ EXIT_CODE RunHingePlot(const T_HINGE_OPTIONS& o)
             component ? PageOf(type.components[static_cast<std::size_t>(*component)], o.end, page)
                       : nullptr;
         if (!curve) return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_CHOOSE_COMPONENT"));
-        plot = HingeBackbonePlot(type, *component, *curve, EndName(page));
+        plot = HingeBackbonePlot(type, *component, *curve, EndName(page), o.box);
     }
     if (const EXIT_CODE code = WritePicture(plot, o.out); code != EXIT_CODE::Done) return code;
     PrintLine(Say("IDS_QM_CLI_HINGE_WRITTEN", o.out));

@@ -48,6 +48,21 @@ void AddHingeCommands(CLI::App& app, EXIT_CODE& code)
     axial->add_option("--change", o->change, Say("IDS_QM_HELP_HINGE_CHANGE"))->expected(2);
     axial->add_option("-o", o->out, Say("IDS_QM_HELP_TO_WRITE"))->required();
     AddOverwrite(axial, o->overwrite);
+    auto* options = AddOne(hinges, "options", Say("IDS_QM_HELP_HINGE_OPTIONS"),
+                           " --concrete Eurocode2:04 --steel Eurocode3:05 -o codes.json", o,
+                           RunHingeModelOptions);
+    options->add_option("--concrete", o->concreteCode, Say("IDS_QM_HELP_HINGE_CONCRETE_CODE"));
+    options->add_option("--steel", o->steelCode, Say("IDS_QM_HELP_HINGE_STEEL_CODE"));
+    const auto onOff = [&](const char* name, std::string& word, const char* help) {
+        options->add_option(name, word, Say(help))->check(CLI::IsMember({"on", "off"}));
+    };
+    onOff("--alternative-hysteresis", o->alternative, "IDS_QM_HELP_HINGE_ALT");
+    onOff("--wall-degradation", o->wallDegradation, "IDS_QM_HELP_HINGE_WALL_DEG");
+    onOff("--gsd", o->gsd, "IDS_QM_HELP_HINGE_GSD");
+    options->add_option("--alpha1", o->alpha1, Say("IDS_QM_HELP_HINGE_ALPHA"))->expected(2);
+    options->add_option("--alpha2", o->alpha2, Say("IDS_QM_HELP_HINGE_ALPHA"))->expected(2);
+    options->add_option("-o", o->out, Say("IDS_QM_HELP_TO_WRITE"));
+    AddOverwrite(options, o->overwrite);
     auto* plot = AddOne(hinges, "plot", Say("IDS_QM_HELP_HINGE_PLOT"),
                         " --type \"steel beam\" --component My -o hinge.svg", o, RunHingePlot);
     type(plot, true);
@@ -55,6 +70,8 @@ void AddHingeCommands(CLI::App& app, EXIT_CODE& code)
     plot->add_option("--end", o->end, Say("IDS_QM_HELP_HINGE_END"))
         ->check(CLI::IsMember({"I", "J"}));
     plot->add_flag("--interaction", o->interaction, Say("IDS_QM_HELP_HINGE_INTERACTION"));
+    plot->add_flag("--values", o->values, Say("IDS_QM_HELP_HINGE_VALUES"));
+    plot->add_flag("--box", o->box, Say("IDS_QM_HELP_HINGE_BOX"));
     plot->add_option("-o", o->out, Say("IDS_QM_HELP_HINGE_PICTURE"))->required();
     AddOverwrite(plot, o->overwrite);
 }

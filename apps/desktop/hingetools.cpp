@@ -1,5 +1,6 @@
 #include "hingetools.h"
 
+#include "qm_rps/hingeoptionsdlg.h"
 #include "qm_rps/po_hingetypelistdlg.h"
 #include "qm_rps/pushoverhingedatatype.h"
 #include "qm_rps/pushoverhingelistdlg.h"
@@ -35,6 +36,13 @@ void RunTable(T_DESKTOP& desktop)
     desktop.changed();
 }
 
+void RunOptions(T_DESKTOP& desktop)
+{
+    CHingeOptionsDlg options(desktop.doc);
+    options.SetView(&desktop.view);
+    if (options.DoModal()) desktop.changed();
+}
+
 void RunTypeEditor(T_DESKTOP& desktop, int key)
 {
     CPO_HingeTypeListDlg list(desktop.doc);
@@ -51,7 +59,7 @@ void RegisterHingeViews(CViewFactory& factory)
     for (const auto add :
          {RegisterHingeListViews, RegisterHingeTypeView, RegisterHingeFemaViews,
           RegisterHingeMultiView, RegisterHingeEuroView, RegisterHingeInteractionViews,
-          RegisterHingeLengthViews, RegisterHingeStrengthViews})
+          RegisterHingeLengthViews, RegisterHingeStrengthViews, RegisterHingeOptionsView})
         add(factory);
 }
 
@@ -60,7 +68,8 @@ T_COMMANDS HingeCommands(T_DESKTOP& desktop)
     return {{kMenu, "IDS_QM_UI_HINGE_TYPES", "Ctrl+Shift+H", [&desktop] { RunTypeList(desktop); }},
             {kMenu, "IDS_QM_UI_HINGES_GENERATED", "Ctrl+Shift+G",
              [&desktop] { RunHingeList(desktop, 0); }},
-            {kMenu, "IDS_QM_UI_HINGE_TABLE", "", [&desktop] { RunTable(desktop); }}};
+            {kMenu, "IDS_QM_UI_HINGE_TABLE", "", [&desktop] { RunTable(desktop); }},
+            {kMenu, "IDS_QM_UI_HINGE_OPTIONS_CMD", "", [&desktop] { RunOptions(desktop); }}};
 }
 
 bool OpenHingeRecord(T_DESKTOP& desktop, EXPLORER_TABLE table, int key)

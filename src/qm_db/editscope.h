@@ -61,6 +61,10 @@ public:
         T_RECORD_USERS users;
         return Erase<R>(key, users);
     }
+    [[nodiscard]] int PutStyp(T_STYP_D styp)
+    {
+        return Take(m_isOpen && m_edit.PutStyp(std::move(styp)));
+    }
     [[nodiscard]] int ErasePhgt(int key, std::vector<int>& users)
     {
         return Take(m_isOpen && m_edit.ErasePhgt(key, users));

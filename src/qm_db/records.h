@@ -36,7 +36,9 @@ struct T_STYP_D {
     bool alternativeHysteresis = false;   // alternative hysteresis models are in use
     bool wallStrengthDegradation = false; // wall types offer the strength degradation curve
     bool gsd = false;                     // My and Mz offer the section-based curve
-    std::optional<MODEL_PLANE> plane{};   // absent: a space model
+    // Stiffness reduction ratios of new multilinear curves, (+) and (-).
+    std::array<double, 2> defaultAlpha1{}, defaultAlpha2{};
+    std::optional<MODEL_PLANE> plane{}; // absent: a space model
     T_STCT_D stageControl{};
     bool operator==(const T_STYP_D&) const = default;
 };

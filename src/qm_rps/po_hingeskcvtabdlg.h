@@ -25,6 +25,9 @@ public:
     /// The curve of a page, or null before Data2Dlg.
     T_SKEL_MULTI* Curve(HINGE_END end);
 
+    T_SIDES<double> m_alpha1, m_alpha2; // defaults of the model
+    /// The button of the default ratios of a page.
+    void OnDefaultAlphaBtn(HINGE_END end) { SetDefaultAlpha(end, m_alpha1, m_alpha2); }
     /// Default stiffness reduction ratios: alpha1 and alpha2 for the positive and negative side.
     void SetDefaultAlpha(HINGE_END end, const T_SIDES<double>& alpha1,
                          const T_SIDES<double>& alpha2);

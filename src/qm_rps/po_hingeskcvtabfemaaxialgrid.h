@@ -11,7 +11,11 @@ public:
     double m_entry = 0.0;  // force to be added
     int m_selected = -1;   // chosen row; -1: none
 
-    void Data2Dlg(const std::vector<T_SKEL_AXIAL>& curves) { m_forces = CAxialForceList(curves); }
+    void Data2Dlg(const std::vector<T_SKEL_AXIAL>& curves,
+                  std::optional<CAxialForceList::T_RANGE> range = {})
+    {
+        m_forces = CAxialForceList(curves, range);
+    }
     /// The list: curves of kept or changed forces as they are, new forces with `fresh`.
     void Dlg2Data(std::vector<T_SKEL_AXIAL>& curves, const T_SIDES<T_SKEL_SIDE>& fresh) const
     {

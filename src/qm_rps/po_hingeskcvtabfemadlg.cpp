@@ -216,7 +216,7 @@ int CPO_HingeSkcvTabFemaDlg::OnAxialForceBtn(HINGE_COMPONENT c, HINGE_END end)
     CPO_HingeSkcvTabFemaAxialGrid grid;
     grid.SetView(View());
     grid.m_owner = m_owner;
-    grid.Data2Dlg(curve->curves);
+    grid.Data2Dlg(curve->curves, m_axialRange);
     if (!grid.DoModal()) return 0;
     grid.Dlg2Data(curve->curves, curve->sides);
     return 1;

@@ -7,6 +7,7 @@
 #pragma once
 
 #include "qm_base/checkeddialog.h"
+#include "qm_rps/hinge/axialforcelist.h"
 #include "qm_rps/hinge/hingefindings.h"
 #include "qm_rps/hinge/pageyield.h"
 
@@ -19,6 +20,8 @@ public:
     using T_ROW = std::array<double, 9>; // -E, -D, -C, -B, A, B, C, D, E
 
     T_HINGE_OWNER m_owner; // for titles and units
+    /// Axial forces of the list; empty: every finite one.
+    std::optional<CAxialForceList::T_RANGE> m_axialRange;
 
     /// Takes a component that has FEMA curves. 1 done; 0 it has other curves.
     [[nodiscard]] int Data2Dlg(HINGE_COMPONENT c, const T_HINGE_COMPONENT& data);

@@ -25,9 +25,22 @@ int Position(const std::vector<ENTRY>& list, SKEL_TYPE code)
     return -1;
 }
 
-void SetType(T_HINGE_COMPONENT& c, SKEL_TYPE type)
+/// An empty curve, a multilinear one with the default ratios of the model.
+T_SKEL_CURVE FreshCurve(SKEL_TYPE type, const T_HINGE_CONTEXT& context)
 {
-    const T_SKEL_CURVE fresh = MakeSkelCurve(type);
+    T_SKEL_CURVE curve = MakeSkelCurve(type);
+    if (auto* m = std::get_if<T_SKEL_MULTI>(&curve)) {
+        m->sides.pos.alpha1 = context.alpha1.pos, m->sides.neg.alpha1 = context.alpha1.neg;
+        m->sides.pos.alpha2 = context.alpha2.pos, m->sides.neg.alpha2 = context.alpha2.neg;
+        m->symmetric =
+            context.alpha1.pos == context.alpha1.neg && context.alpha2.pos == context.alpha2.neg;
+    }
+    return curve;
+}
+
+void SetType(T_HINGE_COMPONENT& c, SKEL_TYPE type, const T_HINGE_CONTEXT& context)
+{
+    const T_SKEL_CURVE fresh = FreshCurve(type, context);
     c.type = type;
     if (c.curves.I.index() != fresh.index()) c.curves.I = fresh;
     if (c.curves.J.index() != fresh.index()) c.curves.J = fresh;
@@ -87,10 +100,11 @@ int CPO_HingeTypeDlg::Dlg2Data(T_PHGT_D& data)
 
 int CPO_HingeTypeDlg::OnApply()
 {
-    if (!CheckData()) return 0;
-    const std::vector<T_FINDING> warnings = HingeTypeWarnings(m_type);
+    T_PHGT_D checked;
+    if (!Dlg2Data(checked)) return 0;
+    const std::vector<T_FINDING> warnings = HingeTypeWarnings(checked);
     if (!warnings.empty()) ShowMessage(warnings.front().messageKey, warnings.front().text);
-    if (m_store && m_store(m_type)) return 1;
+    if (m_store && m_store(checked)) return 1;
     if (m_store) ShowMessage("IDS_QM_HINGE_NOT_STORED");
     return 0;
 }
@@ -137,9 +151,9 @@ T_PART_STATES CPO_HingeTypeDlg::CustomizeDlgByMode() const
     return PartStates(m_type, m_context.altHysteresis);
 }
 
-std::vector<T_STIFFNESS_ROW> CPO_HingeTypeDlg::UpdateInitialStiffness(double memberLength) const
+std::vector<T_STIFFNESS_ROW> CPO_HingeTypeDlg::UpdateInitialStiffness() const
 {
-    return StiffnessRows(m_type, m_context, memberLength);
+    return StiffnessRows(m_type, m_context, m_memberLength);
 }
 
 int CPO_HingeTypeDlg::SelectedSkcv(HINGE_COMPONENT c) const
@@ -188,7 +202,7 @@ int CPO_HingeTypeDlg::OnSelChangeSkcv(HINGE_COMPONENT c, int index)
     if (index < 0 || index >= static_cast<int>(list.size())) return 0;
     const ENTRY& entry = list[static_cast<std::size_t>(index)];
     if (!entry.enabled) return 0;
-    SetType(At(m_type, c), entry.code);
+    SetType(At(m_type, c), entry.code, m_context);
     return 1;
 }
 
@@ -197,6 +211,9 @@ int CPO_HingeTypeDlg::OnBtnSkcvProp(HINGE_COMPONENT c)
     T_HINGE_COMPONENT& component = At(m_type, c);
     if (component.type == SKEL_TYPE::Fema) {
         CPO_HingeSkcvTabFemaDlg dlg;
+        if (m_context.sources)
+            dlg.m_axialRange =
+                m_context.sources->AxialRange(m_type.section, m_type.sectionMaterial);
         return RunEditor(dlg, *this, c) && dlg.Dlg2Data(c, component);
     }
     if (component.type == SKEL_TYPE::Ec8) {
@@ -204,12 +221,22 @@ int CPO_HingeTypeDlg::OnBtnSkcvProp(HINGE_COMPONENT c)
         return RunEditor(dlg, *this, c) && dlg.Dlg2Data(component);
     }
     CPO_HingeSkcvTabDlg dlg;
+    dlg.m_alpha1 = m_context.alpha1;
+    dlg.m_alpha2 = m_context.alpha2;
     return RunEditor(dlg, *this, c) && dlg.Dlg2Data(component);
 }
 
-int CPO_HingeTypeDlg::OnSelChangeInteraction(int index)
+int CPO_HingeTypeDlg::OnSelChangeInteraction(HINGE_COMPONENT c, int index)
 {
-    return ConvertInteraction(index, m_type.interaction);
+    HINGE_INTERACTION chosen{};
+    if (index >= static_cast<int>(OfferedInteractions(m_type, c)) ||
+        !ConvertInteraction(index, chosen))
+        return 0;
+    HINGE_INTERACTION mz = InteractionOf(m_type, HINGE_COMPONENT::Mz);
+    (c == HINGE_COMPONENT::Mz ? mz : m_type.interaction) = chosen;
+    m_type.interactionMz =
+        mz == m_type.interaction ? std::nullopt : std::optional<HINGE_INTERACTION>(mz);
+    return 1;
 }
 
 void CPO_HingeTypeDlg::InitDataByDof(HINGE_COMPONENT c)
@@ -220,7 +247,9 @@ void CPO_HingeTypeDlg::InitDataByDof(HINGE_COMPONENT c)
     T_HINGE_COMPONENT fresh;
     fresh.active = At(m_type, c).active;
     fresh.location = axial || !hasEnds ? HINGE_LOCATION::Center : HINGE_LOCATION::BothEnds;
-    SetType(fresh, CustomizeSkcvCmb(c).front().code);
+    const SKEL_TYPE first = CustomizeSkcvCmb(c).front().code;
+    fresh.type = first;
+    fresh.curves.I = fresh.curves.J = FreshCurve(first, m_context);
     for (T_SKEL_CURVE* curve : {&fresh.curves.I, &fresh.curves.J})
         std::visit(
             [&](auto& k) {
@@ -228,6 +257,21 @@ void CPO_HingeTypeDlg::InitDataByDof(HINGE_COMPONENT c)
             },
             *curve);
     At(m_type, c) = fresh;
+}
+
+int CPO_HingeTypeDlg::OnBtnDefaults()
+{
+    if (!AskYesNo("IDS_QM_UI_HINGE_LOSE_CURVES")) return 0;
+    InitDataCheckedAll();
+    return 1;
+}
+
+int CPO_HingeTypeDlg::OnBtnOptions()
+{
+    const std::optional<T_HINGE_CONTEXT> changed = m_editOptions ? m_editOptions() : std::nullopt;
+    if (!changed) return 0;
+    OnUpdate(*changed);
+    return 1;
 }
 
 void CPO_HingeTypeDlg::InitDataCheckedAll()
@@ -339,6 +383,6 @@ void CPO_HingeTypeDlg::RefillSkcv()
         const auto c = static_cast<HINGE_COMPONENT>(i);
         const std::vector<ENTRY> list = CustomizeSkcvCmb(c);
         if (Position(list, m_type.components[i].type) < 0)
-            SetType(m_type.components[i], list.front().code);
+            SetType(m_type.components[i], list.front().code, m_context);
     }
 }

@@ -24,6 +24,9 @@ public:
 
     /// Writes the record to the document. 1 stored; 0 not. Unset: OnApply refuses.
     std::function<int(const T_PHGT_D&)> m_store;
+    /// Opens the options of the model. The new context; empty: nothing was changed.
+    std::function<std::optional<T_HINGE_CONTEXT>()> m_editOptions;
+    double m_memberLength = 0.0;           // of the first element that uses the type; 0: none does
     std::vector<std::string> m_otherNames; // of other types; the name must be unlike them
 
     /// Takes the record. A component whose curve type is not offered gets the first that is.
@@ -63,8 +66,12 @@ public:
     T_PART_STATES CustomizeDlgByMode() const;
     /// Keys of the materials of a strength calculation that fit the material class.
     static std::vector<const char*> InitComboByMaterialType(MATL_CLASS material);
-    /// See StiffnessRows.
-    std::vector<T_STIFFNESS_ROW> UpdateInitialStiffness(double memberLength) const;
+    /// See StiffnessRows; with m_memberLength.
+    std::vector<T_STIFFNESS_ROW> UpdateInitialStiffness() const;
+    /// A row of them as texts: component, page, option, K(+) and K(-) with their unit.
+    std::array<std::string, 5> StiffnessCells(const T_STIFFNESS_ROW& row) const;
+    /// What the strengths of the material class are calculated as: "Concrete, Steel".
+    std::string StrengthMaterials() const;
 
     // Sections of the document. Fibres of frames: any with dimensions. Fibres of walls, wall
     // sections and thicknesses: rectangles; the thickness (text "2 : 0.3") is the smaller side.
@@ -72,7 +79,7 @@ public:
     T_REF_LIST InitFiberCombo_Fibw() const;
     T_REF_LIST InitPropCombo_Sect() const;
     T_REF_LIST InitPropCombo_Thik() const;
-    /// Materials of the document.
+    /// Materials of the document that fit the material class, and the one that is chosen.
     T_REF_LIST InitPropCombo_Matl() const;
 
     // What changes the lists of curve types fills them again.
@@ -84,8 +91,11 @@ public:
     /// is offered, 6EI/L for bending and the elastic stiffness else, Fx and Mx at the centre
     /// (links, springs and trusses all), the others at both ends.
     void InitDataByDof(HINGE_COMPONENT c);
-    /// The same for every active component.
+    /// The same for every active component; the button asks first. 0: no.
     void InitDataCheckedAll();
+    [[nodiscard]] int OnBtnDefaults();
+    /// Opens the options of the model. 0: nothing was changed.
+    [[nodiscard]] int OnBtnOptions();
 
     void OnComponentCtrl(HINGE_COMPONENT c, bool active);
     void OnLocationCtrl(HINGE_COMPONENT c, HINGE_LOCATION location);
@@ -108,15 +118,23 @@ public:
     void OnInfillStrutChk(bool on);
     bool IsInfillStrut() const;
 
-    /// Position among the bending interactions to record code. 0: no such position.
+    /// Position among kInteractions to record code. 0: no such position.
     [[nodiscard]] static int ConvertInteraction(int index, HINGE_INTERACTION& code);
-    /// Record code to position; -1 for one that bending does not offer.
+    /// Record code to position.
     static int ConvertInteraction(HINGE_INTERACTION code);
-    [[nodiscard]] int OnSelChangeInteraction(int index);
+    /// The interaction of My or of Mz; the other one keeps its own. 0: not offered.
+    [[nodiscard]] int OnSelChangeInteraction(HINGE_COMPONENT c, int index);
 
     /// Lengths of a component at the ends that need one, "I 0.3, J 0.25"; empty where none does.
     std::string GetHingeLength_MTheta(HINGE_COMPONENT c) const; // My and Mz alone
     std::string GetHingeLength_MPhi(HINGE_COMPONENT c) const;
+    /// Those of all components: "My: I 0.3, J 0.25; Mz: I 0.3"; "-" where none needs one.
+    std::string HingeLengthsText() const;
+    /// Key of what the lengths are: Lpl, or Lv with the alternative hysteresis models.
+    const char* HingeLengthCaption() const
+    {
+        return HingeLengthCaptionKey(m_context.altHysteresis);
+    }
 
 private:
     void RefillSkcv();

@@ -5,6 +5,7 @@
 #include "qm_rps/hinge/hingecontext.h"
 #include "qm_rps/hinge/hingelabels.h"
 #include "qm_rps/hinge/hingetable.h"
+#include "qm_rps/hingeoptionsdlg.h"
 #include "qm_rps/po_hingetypedlg.h"
 
 #include <algorithm>
@@ -125,6 +126,15 @@ int CPO_HingeTypeListDlg::Edit(int key, const T_PHGT_D& type, bool fresh)
     CPO_HingeTypeDlg dlg(HingeContextOf(m_doc));
     dlg.SetView(View());
     dlg.m_store = [&](const T_PHGT_D& t) { return StoreHingeType(m_doc, key, t); };
+    dlg.m_editOptions = [&]() -> std::optional<T_HINGE_CONTEXT> {
+        CHingeOptionsDlg options(m_doc);
+        options.SetView(View());
+        if (!options.DoModal()) return std::nullopt;
+        return HingeContextOf(m_doc);
+    };
+    const std::vector<int> users = m_doc.Attr().GetElemsByPhgt(key);
+    if (!users.empty() && !m_doc.Memb().GetMembLengByIncludeElem(users.front(), dlg.m_memberLength))
+        dlg.m_memberLength = 0.0;
     for (const auto& [other, record] : HingeTypesOf(m_doc))
         if (other != key) dlg.m_otherNames.push_back(record.name);
     dlg.Data2Dlg(type);

@@ -2,6 +2,14 @@
 
 #include "qm_rps/hinge/hingepartfindings.h"
 
+void CPushOverPMMInteractionDlg::OnSameSidesChk(bool same)
+{
+    if (same)
+        m_table.negative.reset();
+    else if (!m_table.negative)
+        m_table.negative = m_table.curves;
+}
+
 std::vector<T_FINDING> CPushOverPMMInteractionDlg::Findings() const
 {
     return PmmFindings(m_table);

@@ -14,6 +14,10 @@ public:
 
     T_PMM_TABLE m_table; // as edited; ratios, Pmax a force
 
+    /// (-) as (+), or on its own, starting from the curves of (+).
+    void OnSameSidesChk(bool same);
+    bool IsSameSides() const { return !m_table.negative; }
+
     /// See PmmFindings.
     std::vector<T_FINDING> Findings() const override;
     /// 1 and the record holds the table; 0 and the record is unchanged.

@@ -11,5 +11,6 @@ int CPushoverPMMInteractionGrid::SelectCurve(std::size_t curve)
 
 std::string CPushoverPMMInteractionGrid::CellField(std::size_t row, std::size_t column) const
 {
-    return FormatText("curves[%zu][%zu].%c", m_curve / 2, row, column == 0 ? 'p' : 'm');
+    return FormatText("%s[%zu][%zu].%c", IsOwnNegative() ? "negative" : "curves", m_curve / 2, row,
+                      column == 0 ? 'p' : 'm');
 }

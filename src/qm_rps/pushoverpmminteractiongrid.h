@@ -6,8 +6,8 @@
 inline constexpr std::array<const char*, 4> kPmmCurveNames{"Py-My(+)", "Py-My(-)", "Pz-Mz(+)",
                                                            "Pz-Mz(-)"};
 
-/// Eleven rows, columns P/Pmax and M/Mmax, with 5 digits. Two curves are stored, one per axis: (+)
-/// and (-) of an axis show and edit the same one. The table is not owned.
+/// Eleven rows, columns P/Pmax and M/Mmax, with 5 digits. Where (-) has no curves of its own, it
+/// shows and edits those of (+). The table is not owned.
 class CPushoverPMMInteractionGrid : public CPmPointGrid {
 public:
     explicit CPushoverPMMInteractionGrid(T_PMM_TABLE& table)
@@ -21,11 +21,15 @@ public:
 
     std::size_t Rows() const override { return m_table.curves[0].size(); }
     std::string RowHead(std::size_t row) const override { return std::to_string(row + 1); }
-    /// In the table: "curves[0][3].m".
+    /// In the table: "curves[0][3].m", "negative[1][3].p".
     std::string CellField(std::size_t row, std::size_t column) const override;
 
 private:
-    T_PM_POINT& Point(std::size_t row) const override { return m_table.curves[m_curve / 2][row]; }
+    bool IsOwnNegative() const { return m_curve % 2 == 1 && m_table.negative; }
+    T_PM_POINT& Point(std::size_t row) const override
+    {
+        return (IsOwnNegative() ? *m_table.negative : m_table.curves)[m_curve / 2][row];
+    }
 
     T_PMM_TABLE& m_table;
     std::size_t m_curve = 0;

@@ -110,7 +110,7 @@ TEST(HingeFemaCurve, ReportsEachRuleOutsideItsBoundAlone)
     }
 }
 
-TEST(HingeAxialForces, RefusesTheSameAndTheMissing)
+TEST(HingeAxialForces, RefusesTheSameTheMissingAndTheOutlying)
 {
     F f = ValidBackbone<F>();
     CPO_HingeSkcvTabFemaAxialGrid grid;
@@ -120,6 +120,9 @@ TEST(HingeAxialForces, RefusesTheSameAndTheMissing)
     EXPECT_EQ(0, grid.RemoveForce(1.5) + grid.ChangeForce(3, 4));
     EXPECT_EQ("Old Axial Force 3 does not exist!", grid.Messages().back().text);
     EXPECT_EQ(0, grid.ChangeForce(-100, 200) + grid.AddForce(kNan));
+    EXPECT_EQ("IDS_RPS_PO_FEMA_AXIALFORE_OUTOFRANGE", grid.Messages().back().key);
+    grid.Data2Dlg({{-100, f.sides}, {200, {}}}, CAxialForceList::T_RANGE{-500, 1000});
+    EXPECT_EQ(0, grid.AddForce(1000.5) + grid.AddForce(-500.5) + grid.ChangeForce(200, 1001));
     EXPECT_EQ("IDS_RPS_PO_FEMA_AXIALFORE_OUTOFRANGE", grid.Messages().back().key);
     EXPECT_EQ(1, grid.AddForce(1000));
     EXPECT_EQ(1, grid.AddForce(-500));

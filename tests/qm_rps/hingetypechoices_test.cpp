@@ -1,6 +1,8 @@
 // What the hinge type editor offers and what its buttons do.
 #include "hingesample.h"
+#include "qm_rps/po_hingeskcvtabdlg.h"
 #include "qm_rps/po_hingetypedlg.h"
+#include "scriptview.h"
 
 #include <gtest/gtest.h>
 
@@ -52,6 +54,11 @@ TEST(HingeTypeLists, OfferSectionsByTheirShape)
     EXPECT_EQ("4 : wall;7 : round;", Keys(dlg.InitFiberCombo_Fibr()));
     EXPECT_EQ("4 : wall;", Keys(dlg.InitFiberCombo_Fibw()));
     EXPECT_EQ("4 : 0.25;", Keys(dlg.InitPropCombo_Thik()));
+    EXPECT_EQ("1 : ;", Keys(dlg.InitPropCombo_Matl())); // steel, as the type
+    dlg.OnSelChangeMaterial(MATL_CLASS::Concrete);
+    EXPECT_EQ("", Keys(dlg.InitPropCombo_Matl()));
+    dlg.Edited().sectionMaterial = 1; // what is chosen stays on the list
+    EXPECT_EQ("1 : ;", Keys(dlg.InitPropCombo_Matl()));
     EXPECT_EQ("1 : values;4 : wall;7 : round;", Keys(dlg.InitPropCombo_Sect()));
     dlg.OnSelChangeElement(HINGE_ELEMENT::Wall);
     EXPECT_EQ("4 : wall;", Keys(dlg.InitPropCombo_Sect()));
@@ -84,6 +91,37 @@ TEST(HingeTypeMode, FollowsElementDefinitionAndInteraction)
 }
 
 // By hand: E = 260, G = 100, L = 2; A = 6, Asy = 5, Asz = 4, J = 3, Iyy = 2 (0.5 at I), Izz = 7.
+TEST(HingeTypeInteraction, MyAndMzHaveTheirOwnAndShearItsPair)
+{
+    using I = HINGE_INTERACTION;
+    CPO_HingeTypeDlg dlg(Context());
+    T_PHGT_D type;
+    type.interaction = I::PMM;
+    dlg.Data2Dlg(type);
+    const auto both = [&dlg] {
+        return std::pair(InteractionOf(dlg.Type(), C::My), InteractionOf(dlg.Type(), C::Mz));
+    };
+    EXPECT_EQ(std::pair(I::PMM, I::PMM), both());
+    EXPECT_EQ(1, dlg.OnSelChangeInteraction(C::My, 0)); // Mz stays
+    EXPECT_EQ(std::pair(I::P, I::PMM), both());
+    EXPECT_EQ(1, dlg.OnSelChangeInteraction(C::Mz, 3));
+    EXPECT_EQ(std::pair(I::P, I::User), both());
+    EXPECT_EQ(1, dlg.OnSelChangeInteraction(C::Mz, 0));
+    EXPECT_EQ(std::nullopt, dlg.Type().interactionMz) << "as My again";
+    EXPECT_EQ(0, dlg.OnSelChangeInteraction(C::My, 4)) << "Vy-Vz needs Fy and Fz";
+    dlg.OnComponentCtrl(C::Fy, true);
+    dlg.OnComponentCtrl(C::Fz, true);
+    EXPECT_EQ(1, dlg.OnSelChangeInteraction(C::My, 4));
+    EXPECT_EQ(I::VyVz, dlg.Type().interaction);
+    const auto names = [&dlg](const char* key) {
+        const auto found = dlg.Findings();
+        return std::ranges::count(found, key, &T_FINDING::messageKey);
+    };
+    EXPECT_EQ(0, names("IDS_QM_HINGE_SHEAR_PAIR"));
+    dlg.OnComponentCtrl(C::Fz, false);
+    EXPECT_EQ(1, names("IDS_QM_HINGE_SHEAR_PAIR"));
+}
+
 TEST(HingeTypeStiffness, ComesFromSectionMaterialAndLength)
 {
     T_PHGT_D t;
@@ -102,7 +140,8 @@ TEST(HingeTypeStiffness, ComesFromSectionMaterialAndLength)
     const auto rows = [&](double length) {
         CPO_HingeTypeDlg dlg(Context());
         dlg.Data2Dlg(t);
-        return dlg.UpdateInitialStiffness(length);
+        dlg.m_memberLength = length;
+        return dlg.UpdateInitialStiffness();
     };
     const auto all = rows(2);
     ASSERT_EQ(7u, all.size());
@@ -139,6 +178,34 @@ TEST(HingeTypeDefaults, PutActiveComponentsBack)
     EXPECT_EQ(t.components[5], now[5]);
 }
 
+TEST(HingeTypeDefaults, AskFirstAndTakeTheRatiosOfTheModel)
+{
+    T_HINGE_CONTEXT context;
+    context.alpha1 = {0.1, 0.1}, context.alpha2 = {0.02, 0.03};
+    CPO_HingeTypeDlg dlg(context);
+    CScriptView view;
+    dlg.SetView(&view);
+    T_PHGT_D t;
+    t.components[4] = ComponentWith(SKEL_TYPE::Fema, ValidBackbone<T_SKEL_FEMA>());
+    dlg.Data2Dlg(t);
+    EXPECT_EQ(0, dlg.OnBtnDefaults()); // no
+    EXPECT_EQ(t, dlg.Type());
+    view.m_yes = true;
+    EXPECT_EQ(1, dlg.OnBtnDefaults());
+    const auto& m = std::get<T_SKEL_MULTI>(dlg.Type().components[4].curves.J);
+    EXPECT_EQ(0.1, m.sides.neg.alpha1);
+    EXPECT_EQ(0.03, m.sides.neg.alpha2);
+    EXPECT_FALSE(m.symmetric) << "0.02 and 0.03 differ";
+    // The button of a page of the editor gives them back.
+    CPO_HingeSkcvTabDlg editor;
+    editor.m_alpha1 = {0.2, 0.3};
+    T_HINGE_COMPONENT edited = dlg.Type().components[4];
+    ASSERT_EQ(1, editor.Data2Dlg(C::My, edited));
+    editor.OnDefaultAlphaBtn(HINGE_END::Both);
+    EXPECT_EQ(0.3, editor.Curve(HINGE_END::Both)->sides.neg.alpha1);
+    EXPECT_EQ(0.0, editor.Curve(HINGE_END::Both)->sides.pos.alpha2);
+}
+
 TEST(HingeTypeLengths, AreShownWhereTheCurveNeedsThem)
 {
     T_PHGT_D t;
@@ -152,4 +219,10 @@ TEST(HingeTypeLengths, AreShownWhereTheCurveNeedsThem)
     dlg.Data2Dlg(t);
     EXPECT_EQ("J 0.25", dlg.GetHingeLength_MTheta(C::My));
     EXPECT_EQ("J 0.5", dlg.GetHingeLength_MPhi(C::My));
+    EXPECT_EQ("My: J 0.25", dlg.HingeLengthsText());
+    EXPECT_STREQ("IDS_RPS_PO_HINGE_LENGTH_LPL", dlg.HingeLengthCaption());
+    T_HINGE_CONTEXT alternative;
+    alternative.altHysteresis = true;
+    dlg.OnUpdate(alternative);
+    EXPECT_STREQ("IDS_RPS_PO_HINGE_LENGTH_LV", dlg.HingeLengthCaption());
 }

@@ -30,6 +30,17 @@ TEST(PmmInteractionDlg, NoValueRisesAndPmaxIsNotNegative)
         {[](T_PMM_TABLE& t) { t.curves[0][5].p += 0.1 + 1e-9; }, kCurve, "curves[0][5].p"},
         {[](T_PMM_TABLE& t) { t.curves[1][10].m += 0.05 + 1e-9; }, kCurve, "curves[1][10].m"},
         {[](T_PMM_TABLE& t) { t.curves[1][0].p = kNan; }, kCurve, "curves[1][0].p"},
+        // A balanced point: the moment rises once on the way to it and never again.
+        {[](T_PMM_TABLE& t) { t.balanced = true, t.curves[0][0].m = t.curves[0][1].m = 0.1; }, "",
+         ""},
+        {[](T_PMM_TABLE& t) { t.curves[0][0].m = 0.1; }, kCurve, "curves[0][1].m"},
+        {[](T_PMM_TABLE& t) { t.balanced = true, t.curves[0][5].m += 0.2; }, kCurve,
+         "curves[0][5].m"},
+        {[](T_PMM_TABLE& t) { t.balanced = true, t.curves[0][0].m = kNan; }, kCurve,
+         "curves[0][0].m"},
+        // (-) on its own is judged on its own.
+        {[](T_PMM_TABLE& t) { (t.negative = t.curves)->at(1)[3].p += 0.2; }, kCurve,
+         "negative[1][3].p"},
         {[](T_PMM_TABLE& t) { t.Pmax = 0; }, "", ""},
         {[](T_PMM_TABLE& t) { t.Pmax = -1e-9; }, kPmax, "Pmax"},
     };
@@ -45,6 +56,22 @@ TEST(PmmInteractionDlg, NoValueRisesAndPmaxIsNotNegative)
         EXPECT_EQ(c.key, dlg.Messages().at(0).key);
         EXPECT_EQ(c.field, dlg.Findings().front().field);
     }
+}
+
+TEST(PmmInteractionGrid, ShowsFourCurvesWhereTheNegativeSideHasItsOwn)
+{
+    T_PMM_TABLE record = Table();
+    CPushOverPMMInteractionDlg dlg(record);
+    CPushoverPMMInteractionGrid grid(dlg.m_table);
+    ASSERT_EQ(1, grid.SelectCurve(3)); // Pz-Mz(-)
+    EXPECT_EQ("curves[1][3].m", grid.CellField(3, 1));
+    dlg.OnSameSidesChk(false);
+    EXPECT_EQ("negative[1][3].m", grid.CellField(3, 1));
+    ASSERT_EQ(1, grid.SetCellText(3, 1, "0.25"));
+    EXPECT_EQ(0.25, dlg.m_table.negative.value()[1][3].m);
+    EXPECT_EQ(Table().curves, dlg.m_table.curves);
+    dlg.OnSameSidesChk(true);
+    EXPECT_EQ(Table(), dlg.m_table);
 }
 
 TEST(PmmInteractionGrid, PastesABlockThatFitsAndNothingElse)

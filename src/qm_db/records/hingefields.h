@@ -220,11 +220,19 @@ void CaseFields(V& v, T_FIELD_REF<V, T_YIELD_SURFACE> r)
 }
 
 template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_PMM_CURVES> r)
+{
+    v.Pairs("curve_1", r[0]);
+    v.Pairs("curve_2", r[1]);
+}
+
+template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_PMM_TABLE> r)
 {
     v.Opt("Pmax", r.Pmax, 0.0, kDimForce);
-    v.Pairs("curve_1", r.curves[0]);
-    v.Pairs("curve_2", r.curves[1]);
+    CaseFields(v, r.curves);
+    v.PartIf("negative", r.negative);
+    v.Opt("balanced", r.balanced, false);
 }
 
 template <class V>
@@ -285,6 +293,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_PHGT_D> r)
               "IDS_QM_CHOICE_DEFINITION");
     v.EnumOpt("interaction", r.interaction, d.interaction, kInteractionNames,
               "IDS_QM_CHOICE_INTERACTION");
+    v.EnumIf("interaction_Mz", r.interactionMz, kInteractionNames, "IDS_QM_CHOICE_INTERACTION");
     v.EnumOpt("material", r.material, d.material, kMatlNames, "IDS_QM_CHOICE_MATERIAL");
     v.OptKeyRef("section", r.section, KindOf<T_SECT_D>());
     v.OptKeyRef("section_material", r.sectionMaterial, KindOf<T_MATL_D>());

@@ -163,10 +163,13 @@ struct T_YIELD_SURFACE {
     bool operator==(const T_YIELD_SURFACE&) const = default;
 };
 
-/// User P-M interaction: two curves of eleven points, P / Pmax and M / Mmax, and Pmax.
+/// User P-M interaction: two curves of eleven points, about y and z, P / Pmax and M / Mmax.
+using T_PMM_CURVES = std::array<std::array<T_PM_POINT, 11>, 2>;
 struct T_PMM_TABLE {
     double Pmax = 0.0;
-    std::array<std::array<T_PM_POINT, 11>, 2> curves{};
+    T_PMM_CURVES curves{};                  // (+), and (-) where that has none of its own
+    std::optional<T_PMM_CURVES> negative{}; // (-)
+    bool balanced = false; // M rises from pure compression up to a balanced point, then falls
     bool operator==(const T_PMM_TABLE&) const = default;
 };
 
@@ -194,7 +197,8 @@ struct T_PHGT_D {
     std::string name;
     HINGE_ELEMENT element = HINGE_ELEMENT::BeamColumn;
     HINGE_DEFINITION definition = HINGE_DEFINITION::MomentRotation;
-    HINGE_INTERACTION interaction = HINGE_INTERACTION::P;
+    HINGE_INTERACTION interaction = HINGE_INTERACTION::P; // of My, or of Fy and Fz
+    std::optional<HINGE_INTERACTION> interactionMz{};     // absent: as of My
     MATL_CLASS material = MATL_CLASS::Steel;
     std::array<T_HINGE_COMPONENT, 6> components; // by HINGE_COMPONENT
     int section = 0, sectionMaterial = 0;        // keys that automatic strengths read; 0: none

@@ -63,6 +63,8 @@ void OptionFields(V& v, T_FIELD_REF<V, T_STYP_D> r)
         options.Opt("alternative_hysteresis", r.alternativeHysteresis, false);
         options.Opt("wall_strength_degradation", r.wallStrengthDegradation, false);
         options.Opt("gsd", r.gsd, false);
+        options.Padded("default_alpha1", r.defaultAlpha1, kDimNone);
+        options.Padded("default_alpha2", r.defaultAlpha2, kDimNone);
     });
 }
 

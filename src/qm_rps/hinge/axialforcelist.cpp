@@ -16,20 +16,15 @@ zql::frx::T_MESSAGE Refused(const char* literal, double axial)
     return {literal, text};
 }
 
-CAxialForceList::REFUSAL OutOfRange(double axial)
-{
-    if (std::isfinite(axial)) return std::nullopt;
-    constexpr const char* key = "IDS_RPS_PO_FEMA_AXIALFORE_OUTOFRANGE";
-    return zql::frx::T_MESSAGE{key, zql::lib::MMSGFunction::GetValue(key)};
-}
-
 constexpr const char* kExists = "Axial Force %g already exists!";
 constexpr const char* kGone = "Axial Force %g does not exist!";
 constexpr const char* kOldGone = "Old Axial Force %g does not exist!";
 
 } // namespace
 
-CAxialForceList::CAxialForceList(const std::vector<T_SKEL_AXIAL>& curves) : m_given(curves)
+CAxialForceList::CAxialForceList(const std::vector<T_SKEL_AXIAL>& curves,
+                                 std::optional<T_RANGE> range)
+    : m_given(curves), m_range(range)
 {
     for (std::size_t i = 0; i < curves.size(); ++i)
         m_rows.push_back({curves[i].axial, static_cast<int>(i)});
@@ -44,6 +39,16 @@ std::vector<T_SKEL_AXIAL> CAxialForceList::Curves(const T_SIDES<T_SKEL_SIDE>& fr
         curves.push_back(
             {r.axial, r.source < 0 ? fresh : m_given[static_cast<std::size_t>(r.source)].sides});
     return curves;
+}
+
+CAxialForceList::REFUSAL CAxialForceList::OutOfRange(double axial) const
+{
+    constexpr const char* key = "IDS_RPS_PO_FEMA_AXIALFORE_OUTOFRANGE";
+    const bool inside = !m_range || (m_range->lowest <= axial && axial <= m_range->highest);
+    if (std::isfinite(axial) && inside) return std::nullopt;
+    std::string text = zql::lib::MMSGFunction::GetValue(key);
+    if (m_range) text += FormatText(" [%g, %g]", m_range->lowest, m_range->highest);
+    return zql::frx::T_MESSAGE{key, text};
 }
 
 CAxialForceList::REFUSAL CAxialForceList::Add(double axial)

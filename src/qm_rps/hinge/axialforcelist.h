@@ -18,8 +18,15 @@ public:
         int source = -1;
     };
 
+    /// Forces that a section can carry, compression positive.
+    struct T_RANGE {
+        double lowest = 0.0, highest = 0.0;
+    };
+
     CAxialForceList() = default;
-    explicit CAxialForceList(const std::vector<T_SKEL_AXIAL>& curves);
+    /// Without a range every finite force is taken.
+    explicit CAxialForceList(const std::vector<T_SKEL_AXIAL>& curves,
+                             std::optional<T_RANGE> range = {});
 
     /// Ascending.
     const std::vector<T_ROW>& Rows() const { return m_rows; }
@@ -32,9 +39,11 @@ public:
     [[nodiscard]] REFUSAL Remove(double axial);
 
 private:
+    REFUSAL OutOfRange(double axial) const;
     int Find(double axial) const; // index or -1
     void Sort();
 
     std::vector<T_SKEL_AXIAL> m_given;
     std::vector<T_ROW> m_rows;
+    std::optional<T_RANGE> m_range;
 };

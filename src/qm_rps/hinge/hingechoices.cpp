@@ -1,5 +1,6 @@
 #include "qm_rps/hinge/hingechoices.h"
 
+#include "qm_base/msgfunction.h"
 #include "qm_rps/hinge/hingetheta.h"
 
 #include <algorithm>
@@ -17,6 +18,18 @@ constexpr ENTRY kFema{"IDS_RPS_PO_PHGT_SKCV_FEMA", SKEL_TYPE::Fema};
 constexpr ENTRY kDegrading{"IDS_RPS_PO_PHGT_SKCV_STRENGTH_DEG_TYPE", SKEL_TYPE::Fema};
 constexpr ENTRY kGsd{"IDS_RPS_PO_PHGT_SKCV_GSD_TYPE", SKEL_TYPE::Fema};
 constexpr const char* kEc8Key = "IDS_RPS_PO_PHGT_SKCV_EC8";
+
+struct T_CODE_PAIR {
+    const char *concrete, *steel;
+    YIELD_CODE code;
+};
+constexpr T_CODE_PAIR kCodePairs[] = {
+    {"Eurocode2", "Eurocode3", YIELD_CODE::Eurocode},
+    {"Eurocode2", "Eurocode3:05", YIELD_CODE::Eurocode},
+    {"Eurocode2:04", "Eurocode3", YIELD_CODE::Eurocode},
+    {"Eurocode2:04", "Eurocode3:05", YIELD_CODE::Eurocode},
+    {"AIJ-WSD99", "AIJ-ASD02", YIELD_CODE::Aij},
+};
 
 /// The entry under which code 4 is listed, or null.
 const ENTRY* FemaEntry(const T_PHGT_D& t, HINGE_COMPONENT c, const T_HINGE_CONTEXT& x)
@@ -57,10 +70,15 @@ bool BendingActive(const T& t)
 {
     return At(t, C::My).active || At(t, C::Mz).active;
 }
+bool CanInteract(const T& t)
+{
+    return BendingActive(t) || HasShearPair(t);
+}
 template <HINGE_INTERACTION I>
 bool Interacts(const T& t)
 {
-    return BendingActive(t) && t.interaction == I;
+    return (At(t, C::My).active && InteractionOf(t, C::My) == I) ||
+           (At(t, C::Mz).active && InteractionOf(t, C::Mz) == I);
 }
 bool HasFrameFibres(const T& t)
 {
@@ -91,9 +109,9 @@ struct T_PART_ROW {
 };
 using P = HINGE_PART;
 constexpr T_PART_ROW kParts[] = {
-    {P::Interaction, Bends, BendingActive},
+    {P::Interaction, Bends, CanInteract},
     {P::YieldSurface, Bends, Interacts<HINGE_INTERACTION::PMM>},
-    {P::UserInteraction, Bends, Interacts<HINGE_INTERACTION::User>},
+    {P::UserInteraction, Bends, HasUserInteraction},
     {P::Section, IsLine},
     {P::Thickness, IsWall},
     {P::FibreFrame, HasFrameFibres},
@@ -145,15 +163,52 @@ const char* CurveKey(SKEL_TYPE code)
     return at < std::size(keys) ? keys[at] : "IDS_PUSHOVER_Error";
 }
 
+YIELD_CODE YieldCodeOf(const std::string& concreteCode, const std::string& steelCode)
+{
+    const auto pair = [&](const T_CODE_PAIR& p) {
+        return concreteCode == p.concrete && steelCode == p.steel;
+    };
+    const auto at = std::ranges::find_if(kCodePairs, pair);
+    return at == std::end(kCodePairs) ? YIELD_CODE::General : at->code;
+}
+
+std::string YieldCodeText(const std::string& concreteCode, const std::string& steelCode)
+{
+    static constexpr const char* keys[] = {"IDS_QM_HINGE_CODE_GENERAL", "IDS_QM_HINGE_CODE_EURO",
+                                           "IDS_QM_HINGE_CODE_AIJ"};
+    const auto code = static_cast<std::size_t>(YieldCodeOf(concreteCode, steelCode));
+    return zql::lib::MMSGFunction::GetValue(keys[code]);
+}
+
 bool IsEurocodePair(const std::string& concreteCode, const std::string& steelCode)
 {
-    return (concreteCode == "Eurocode2" || concreteCode == "Eurocode2:04") &&
-           (steelCode == "Eurocode3" || steelCode == "Eurocode3:05");
+    return YieldCodeOf(concreteCode, steelCode) == YIELD_CODE::Eurocode;
 }
 
 bool HasComponent(HINGE_ELEMENT element, HINGE_COMPONENT c)
 {
     return element != HINGE_ELEMENT::Truss || c == HINGE_COMPONENT::Fx;
+}
+
+HINGE_INTERACTION InteractionOf(const T_PHGT_D& type, HINGE_COMPONENT c)
+{
+    return c == C::Mz ? type.interactionMz.value_or(type.interaction) : type.interaction;
+}
+
+bool HasShearPair(const T_PHGT_D& type)
+{
+    return At(type, C::Fy).active && At(type, C::Fz).active;
+}
+
+bool HasUserInteraction(const T_PHGT_D& type)
+{
+    return Interacts<HINGE_INTERACTION::User>(type);
+}
+
+std::size_t OfferedInteractions(const T_PHGT_D& type, HINGE_COMPONENT c)
+{
+    const bool shear = HasShearPair(type) || InteractionOf(type, c) == HINGE_INTERACTION::VyVz;
+    return kInteractions.size() - (shear ? 0 : 1);
 }
 
 SKEL_TYPE YieldSurfaceCurve(const T_PHGT_D& type)

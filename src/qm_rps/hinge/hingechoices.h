@@ -16,6 +16,13 @@ std::vector<T_SKCV_ENTRY> OfferedCurves(const T_PHGT_D& type, HINGE_COMPONENT c,
                                         const T_HINGE_CONTEXT& context);
 /// Key of the text of a curve type; a code outside the list is shown as an error.
 const char* CurveKey(SKEL_TYPE code);
+/// Mode of the strength calculation of a pair of design codes, exact spelling: Eurocode "Eurocode2"
+/// or "Eurocode2:04" with "Eurocode3" or "Eurocode3:05"; AIJ "AIJ-WSD99" with "AIJ-ASD02"; any
+/// other pair is general.
+enum class YIELD_CODE { General, Eurocode, Aij };
+YIELD_CODE YieldCodeOf(const std::string& concreteCode, const std::string& steelCode);
+/// What it means for the strengths here, in words.
+std::string YieldCodeText(const std::string& concreteCode, const std::string& steelCode);
 /// The codes under which the Eurocode curve is enabled: "Eurocode2", "Eurocode2:04" with
 /// "Eurocode3", "Eurocode3:05".
 bool IsEurocodePair(const std::string& concreteCode, const std::string& steelCode);
@@ -23,9 +30,17 @@ bool IsEurocodePair(const std::string& concreteCode, const std::string& steelCod
 /// Degrees of freedom that the element type has: a truss Fx alone, others all.
 bool HasComponent(HINGE_ELEMENT element, HINGE_COMPONENT c);
 
-/// The bending components offer these interactions, in this order; My and Mz share one.
-inline constexpr std::array<HINGE_INTERACTION, 4> kBendingInteractions{
-    HINGE_INTERACTION::P, HINGE_INTERACTION::MyMz, HINGE_INTERACTION::PMM, HINGE_INTERACTION::User};
+/// My and Mz each offer these interactions, in this order; Vy-Vz where Fy and Fz are active.
+inline constexpr std::array<HINGE_INTERACTION, 5> kInteractions{
+    HINGE_INTERACTION::P, HINGE_INTERACTION::MyMz, HINGE_INTERACTION::PMM, HINGE_INTERACTION::User,
+    HINGE_INTERACTION::VyVz};
+/// The interaction of My or Mz.
+HINGE_INTERACTION InteractionOf(const T_PHGT_D& type, HINGE_COMPONENT c);
+/// How many of them a component offers: Vy-Vz too where it has it already.
+std::size_t OfferedInteractions(const T_PHGT_D& type, HINGE_COMPONENT c);
+bool HasShearPair(const T_PHGT_D& type);
+/// My or Mz is active and has the P-M curves of the user.
+bool HasUserInteraction(const T_PHGT_D& type);
 
 /// The curve type that fixes the levels of the yield surface: that of My, else of Mz.
 SKEL_TYPE YieldSurfaceCurve(const T_PHGT_D& type);

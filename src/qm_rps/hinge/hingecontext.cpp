@@ -8,6 +8,10 @@ T_HINGE_CONTEXT HingeContextOf(CDBDoc& doc)
     context.strengthDegradation = model.styp.wallStrengthDegradation;
     context.gsd = context.gsdAllowed = model.styp.gsd;
     context.units = model.styp.units;
+    const auto& [pos1, neg1] = model.styp.defaultAlpha1;
+    const auto& [pos2, neg2] = model.styp.defaultAlpha2;
+    context.alpha1 = {pos1, neg1};
+    context.alpha2 = {pos2, neg2};
     context.concreteCode = doc.Lib().GetConCodeName();
     context.steelCode = doc.Lib().GetStlCodeName();
     T_TABLE<T_SECT_D> sections = model.sections; // in SI

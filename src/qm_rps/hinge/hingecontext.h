@@ -13,7 +13,8 @@ struct T_HINGE_CONTEXT {
     bool gsd = false;        // section-based curves are switched on ...
     bool gsdAllowed = false; // ... and the product allows them
     std::string concreteCode, steelCode;
-    T_UNITS units; // of the type
+    T_UNITS units;                  // of the type
+    T_SIDES<double> alpha1, alpha2; // stiffness reduction ratios of new multilinear curves
     /// In the units of the type; null: references and automatic strengths are not judged.
     std::shared_ptr<const CHingeSources> sources;
 };

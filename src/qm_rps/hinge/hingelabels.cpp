@@ -1,6 +1,7 @@
 #include "qm_rps/hinge/hingelabels.h"
 
 #include "qm_base/msgfunction.h"
+#include "qm_base/textformat.h"
 #include "qm_rps/dialog/unithead.h"
 #include "qm_rps/hinge/hingefindings.h"
 
@@ -89,4 +90,25 @@ int StiffnessPosition(HINGE_COMPONENT c, INIT_STIFFNESS option)
     const std::vector<INIT_STIFFNESS> options = StiffnessOptions(c);
     const auto at = std::ranges::find(options, option);
     return at == options.end() ? -1 : static_cast<int>(at - options.begin());
+}
+
+std::string HingeModelLabel(HINGE_DEFINITION definition, HINGE_COMPONENT c)
+{
+    static constexpr const char* labels[] = {"Moment - Rotation (M-%s)",
+                                             "Moment - Curvature (M-%s Lumped)",
+                                             "Moment - Curvature (M-%s Distributed)"};
+    static constexpr const char* symbols[] = {"Rx", "Ry", "Rz"};
+    if (!IsMoment(c)) return {};
+    const auto symbol = static_cast<std::size_t>(c) - static_cast<std::size_t>(HINGE_COMPONENT::Mx);
+    return FormatText(labels[static_cast<std::size_t>(definition)], symbols[symbol]);
+}
+
+const char* HingeLengthCaptionKey(bool altHysteresis)
+{
+    return altHysteresis ? "IDS_RPS_PO_HINGE_LENGTH_LV" : "IDS_RPS_PO_HINGE_LENGTH_LPL";
+}
+
+std::string CriterionText(bool inUse, double value)
+{
+    return inUse ? ShortestText(value) : MMSGFunction::GetValue("IDS_RPS_PO_FEMA_Inactive");
 }

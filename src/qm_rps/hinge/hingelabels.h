@@ -27,6 +27,14 @@ std::string StiffnessHead(const std::string& name, HINGE_COMPONENT c, const T_HI
 /// Key of the yield deformation's name: displacement, rotation, curvature or strain.
 const char* YieldDeformKey(HINGE_COMPONENT c, HINGE_DEFINITION definition);
 
+/// "Moment - Rotation (M-%s)", "Moment - Curvature (M-%s Lumped)" or "... Distributed)" with the
+/// component's rotation symbol Rx, Ry or Rz; empty for a force.
+std::string HingeModelLabel(HINGE_DEFINITION definition, HINGE_COMPONENT c);
+/// Key of the name of a hinge length.
+const char* HingeLengthCaptionKey(bool altHysteresis);
+/// A criterion as shown: its value, or that the criteria are not in use.
+std::string CriterionText(bool inUse, double value);
+
 /// Initial stiffness options of a component: 6EI/L, 3EI/L, 2EI/L and user of bending, the elastic
 /// stiffness and user of the others.
 std::vector<INIT_STIFFNESS> StiffnessOptions(HINGE_COMPONENT c);

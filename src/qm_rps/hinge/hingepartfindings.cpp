@@ -26,6 +26,7 @@ constexpr T_RULE<M> kMasonry[] = {
 struct T_POINT_CHECK {
     const T_PM_POINT& now;
     const T_PM_POINT* before; // null: the first, which must only be finite
+    bool mayRise = false;     // the moment, on its way to the balanced point
 };
 using P = T_POINT_CHECK;
 
@@ -34,7 +35,9 @@ constexpr T_RULE<P> kUserPoint[] = {
     {{.message = kCurve, .text = "P/Pmax", .field = "p"},
      [](const P& c) { return c.before ? NotAbove(c.now.p, c.before->p) : std::isfinite(c.now.p); }},
     {{.message = kCurve, .text = "M/Mmax", .field = "m"},
-     [](const P& c) { return c.before ? NotAbove(c.now.m, c.before->m) : std::isfinite(c.now.m); }},
+     [](const P& c) {
+         return c.before && !c.mayRise ? NotAbove(c.now.m, c.before->m) : std::isfinite(c.now.m);
+     }},
 };
 constexpr T_RULE<T_PMM_TABLE> kUserTable[] = {
     {{.message = "IDS_PUSHOVER_PMAX_POS", .text = "Pmax >= 0", .field = "Pmax"},
@@ -216,14 +219,21 @@ std::vector<T_FINDING> YieldSurfaceFindings(const T_YIELD_SURFACE& surface, SKEL
 std::vector<T_FINDING> PmmFindings(const T_PMM_TABLE& table)
 {
     T_FINDINGS out;
-    for (std::size_t c = 0; c < table.curves.size(); ++c)
-        for (std::size_t i = 0; i < table.curves[c].size(); ++i) {
-            const P check{table.curves[c][i], i ? &table.curves[c][i - 1] : nullptr};
-            WalkRules(
-                kUserPoint, check,
-                {.prefix = FormatText("curves[%zu][%zu].", c, i), .point = std::to_string(i + 1)},
-                out);
+    const auto walk = [&](const T_PMM_CURVES& curves, const char* field) {
+        for (std::size_t c = 0; c < curves.size(); ++c) {
+            bool mayRise = table.balanced;
+            for (std::size_t i = 0; i < curves[c].size(); ++i) {
+                const P check{curves[c][i], i ? &curves[c][i - 1] : nullptr, mayRise};
+                WalkRules(kUserPoint, check,
+                          {.prefix = FormatText("%s[%zu][%zu].", field, c, i),
+                           .point = std::to_string(i + 1)},
+                          out);
+                mayRise = mayRise && !(check.before && check.now.m < check.before->m);
+            }
         }
+    };
+    walk(table.curves, "curves");
+    if (table.negative) walk(*table.negative, "negative");
     WalkRules(kUserTable, table, {}, out);
     return out;
 }

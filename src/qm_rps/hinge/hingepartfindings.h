@@ -24,8 +24,9 @@ std::vector<T_YIELD_LEVEL_NAMES> YieldLevels(SKEL_TYPE type);
 /// axis that is not used is not checked. Under IDS_CMD_IEHP_YIELD.
 std::vector<T_FINDING> YieldSurfaceFindings(const T_YIELD_SURFACE& surface, SKEL_TYPE type);
 
-/// Along each curve neither P nor M rises (equal values pass), then Pmax >= 0. Keys:
-/// IDS_PUSHOVER_Wrong_Data_in_P_values, IDS_PUSHOVER_PMAX_POS.
+/// Along each curve neither P nor M rises (equal values pass); with a balanced point M may rise
+/// before it first falls. Then Pmax >= 0. Keys: IDS_PUSHOVER_Wrong_Data_in_P_values,
+/// IDS_PUSHOVER_PMAX_POS.
 std::vector<T_FINDING> PmmFindings(const T_PMM_TABLE& table);
 
 std::vector<T_FINDING> MasonryFindings(const T_MASONRY_HINGE& masonry);

@@ -8,7 +8,7 @@
 
 namespace {
 
-constexpr double kEdge = 2.0;
+constexpr double kEdge = kPreviewEdge;
 constexpr double kZeroTheta = 1e-7;
 constexpr double kSchematicGap = 0.25; // of Dy
 
@@ -200,4 +200,12 @@ int BackboneOf(const T_SKEL_CURVE& curve, SKEL_TYPE type, T_HINGE_PREVIEW& out)
     ok = ok && AllFinite(p);
     out = ok ? p : T_HINGE_PREVIEW();
     return ok ? 1 : 0;
+}
+
+int PreviewOf(const T_SKEL_CURVE& curve, SKEL_TYPE type, T_HINGE_PREVIEW& out)
+{
+    if (!BackboneOf(curve, type, out)) return 0;
+    AdjustEndPoint(out.line);
+    AdjustEndPoint(out.line); // the positive side may have waited
+    return 1;
 }

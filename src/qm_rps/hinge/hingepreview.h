@@ -20,6 +20,9 @@ struct T_HINGE_PREVIEW {
     bool schematicGap = false;          // the gap's scale is not known: drawn as a quarter of Dy
 };
 
+/// Half the side of the box of the small preview, in yield-normalised units.
+inline constexpr double kPreviewEdge = 2.0;
+
 /// Extends the outermost segment of each side along its own line to the edge of the box -2 ... 2.
 /// Negative side first: where its end has both coordinates above -2 it is moved to x = -2, or to
 /// y = -2 if the line passes below that first, and the positive side is left as it is in this call
@@ -30,3 +33,6 @@ void AdjustEndPoint(std::vector<T_PREVIEW_POINT>& line);
 /// Backbone and criteria of a curve, ends not extended. 1 done; 0 when the curve has no shape yet
 /// (strengths of a trilinear curve not known, values not finite); out is then empty.
 [[nodiscard]] int BackboneOf(const T_SKEL_CURVE& curve, SKEL_TYPE type, T_HINGE_PREVIEW& out);
+
+/// BackboneOf with both ends extended to the edge of the box -2 ... 2, for the small preview.
+[[nodiscard]] int PreviewOf(const T_SKEL_CURVE& curve, SKEL_TYPE type, T_HINGE_PREVIEW& out);

@@ -48,3 +48,11 @@ T_PM_LINES CHingeSources::Lines(int section, int material) const
         }
     return lines;
 }
+
+std::optional<CAxialForceList::T_RANGE> CHingeSources::AxialRange(int section, int material) const
+{
+    const T_RESULT* result = Strength(section, material);
+    if (!result || result->fault != SECT_FAULT::None) return std::nullopt;
+    const T_YIELD_LEVEL& level = result->strength.level;
+    return CAxialForceList::T_RANGE{-level.tension, level.compression};
+}

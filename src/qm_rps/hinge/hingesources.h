@@ -2,6 +2,7 @@
 #pragma once
 
 #include "qm_db/records.h"
+#include "qm_rps/hinge/axialforcelist.h"
 #include "qm_rps/hinge/sectionstrength.h"
 
 #include <algorithm>
@@ -38,6 +39,10 @@ public:
     /// The whole interaction curves of the same pair, see CSectionStrength::CalcCurve. Empty where
     /// the strengths can't be calculated.
     T_PM_LINES Lines(int section, int material) const;
+
+    /// Axial forces that the pair can carry, compression positive: from minus the strength in
+    /// tension to that in compression. Empty where they can't be calculated.
+    std::optional<CAxialForceList::T_RANGE> AxialRange(int section, int material) const;
 
     /// True for a section whose fibres a frame can have: one with dimensions.
     static bool HasFibres(const T_SECT_D& section) { return section.shape != SECT_SHAPE::Value; }

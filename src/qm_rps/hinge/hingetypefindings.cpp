@@ -41,6 +41,12 @@ bool NeedsBars(const T& t)
            t.Material()->type == MATL_CLASS::Concrete;
 }
 
+bool HasShearInteraction(const T& t)
+{
+    return t.type.interaction == HINGE_INTERACTION::VyVz ||
+           t.type.interactionMz == HINGE_INTERACTION::VyVz;
+}
+
 constexpr const char* kNoSection = "IDS_CMD_IEHP_NO_SECT";
 constexpr const char* kNoWall = "IDS_CMD_IEHP_NO_WALL";
 constexpr T_RULE<T> kTypeRules[] = {
@@ -70,6 +76,9 @@ constexpr T_RULE<T> kTypeRules[] = {
     {{.message = kNoWall, .field = "section"},
      [](const T& t) { return CHingeSources::IsWall(*t.Section()); },
      [](const T& t) { return t.sources && t.IsWall() && t.Section(); }},
+    {{.message = "IDS_QM_HINGE_SHEAR_PAIR", .field = "interaction"},
+     [](const T& t) { return HasShearPair(t.type); },
+     HasShearInteraction},
     {{.message = "IDS_CMD_IEHP_NO_RBAR", .field = "section"},
      [](const T& t) { return !t.Section()->bars.empty(); },
      NeedsBars},

@@ -71,11 +71,10 @@ void BuildEuro(CFormView& form, DLG& dlg)
         form.Columns();
         AddPage(form, dlg, end, end == HINGE_END::J ? "J." : "");
         form.NextColumn();
-        form.Picture([&dlg, end, title] {
-                return HingeBackbonePlot(dlg.m_owner.type, dlg.Which(), *dlg.Curve(end),
-                                         zql::lib::MMSGFunction::GetValue(title));
-            })
-            .name = std::string(end == HINGE_END::J ? "J." : "") + "picture";
+        AddBackbonePicture(form, [&dlg, end, title](bool box) {
+            return HingeBackbonePlot(dlg.m_owner.type, dlg.Which(), *dlg.Curve(end),
+                                     zql::lib::MMSGFunction::GetValue(title), box);
+        }).name = std::string(end == HINGE_END::J ? "J." : "") + "picture";
         form.EndColumns();
     });
     form.EndPages();

@@ -191,10 +191,11 @@ void AddOptionsPage(CFormView& form, const T_FEMA_PAGE& p)
         p.Is(&T_SKEL_FEMA::infillStrut));
 }
 
-T_PLOT Preview(const T_FEMA_PAGE& p)
+T_PLOT Preview(const T_FEMA_PAGE& p, bool box)
 {
     return HingeBackbonePlot(p.dlg.m_owner.type, p.c, p.dlg.ShownCurve(p.c, p.end),
-                             MMSGFunction::GetValue(PageTitleKey(*p.dlg.Component(p.c), p.end)));
+                             MMSGFunction::GetValue(PageTitleKey(*p.dlg.Component(p.c), p.end)),
+                             box);
 }
 
 void BuildFema(CFormView& form, DLG& dlg)
@@ -216,7 +217,8 @@ void BuildFema(CFormView& form, DLG& dlg)
         AddOptionsPage(form, page);
         form.EndPages();
         form.NextColumn();
-        form.Picture([page] { return Preview(page); }).name = page.prefix + "picture";
+        AddBackbonePicture(form, [page](bool box) { return Preview(page, box); }).name =
+            page.prefix + "picture";
         form.EndColumns();
     });
     form.EndPages();

@@ -192,3 +192,13 @@ CFormField& MarkedGrid(CFormView& form, std::shared_ptr<CNumberGrid> grid,
     };
     return form.Grid(std::move(b));
 }
+
+CFormField& AddBackbonePicture(CFormView& form, std::function<T_PLOT(bool box)> plot)
+{
+    const auto box = std::make_shared<bool>(false);
+    form.Choice(KeyText("IDS_QM_UI_HINGE_PREVIEW"),
+                {[box] { return *box ? 1 : 0; }, [box](const int& i) { *box = i == 1; }},
+                KeyTexts({"IDS_QM_UI_HINGE_PREVIEW_WHOLE", "IDS_QM_UI_HINGE_PREVIEW_BOX"}))
+        .name = "box";
+    return form.Picture([box, plot] { return plot(*box); });
+}

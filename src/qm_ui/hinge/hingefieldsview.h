@@ -78,6 +78,9 @@ void AddCriteriaCells(CFormView& form, const T_BACKBONE_PAGE& page);
 /// Yield strengths, yield deformations and user stiffness of both sides.
 void AddYieldCells(CFormView& form, const T_BACKBONE_PAGE& page);
 
+/// The picture of a curve, with a choice between the whole curve and the small box.
+CFormField& AddBackbonePicture(CFormView& form, std::function<T_PLOT(bool box)> plot);
+
 /// A number grid whose cells are marked by the findings that name them. prefix: of their fields.
 /// The findings are those of the form's last pass.
 using T_FINDINGS_OF_PASS = std::shared_ptr<std::vector<T_FINDING>>;

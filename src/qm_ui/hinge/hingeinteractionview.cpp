@@ -87,8 +87,9 @@ void AddLevel(CFormView& form, SURFACE& dlg, const SURFACE::T_LEVEL& level,
     form.EndPages();
     form.NextColumn();
     form.Picture([&dlg, level] {
-        return HingeInteractionPlot(dlg.m_owner.type, *level.level,
-                                    MMSGFunction::GetValue(level.titleKey));
+        return HingeInteractionPlot(
+            dlg.m_owner.type, *level.level, MMSGFunction::GetValue(level.titleKey), {},
+            dlg.m_showValue ? std::optional(dlg.m_owner.units) : std::nullopt);
     });
     form.EndColumns();
 }
@@ -131,6 +132,11 @@ void BuildUserInteraction(CFormView& form, CPushOverPMMInteractionDlg& dlg)
         {[grid] { return static_cast<int>(grid->Curve()); },
          [grid](const int& i) { (void)grid->SelectCurve(static_cast<std::size_t>(i)); }},
         [] { return std::vector<std::string>(kPmmCurveNames.begin(), kPmmCurveNames.end()); });
+    form.Flag(KeyText("IDS_QM_UI_HINGE_PM_SAME"),
+              {[&dlg] { return dlg.IsSameSides(); },
+               [&dlg](const bool& same) { dlg.OnSameSidesChk(same); }})
+        .name = "sameSides";
+    form.Flag(KeyText("IDS_QM_UI_HINGE_PM_BALANCED"), Ref(dlg.m_table.balanced)).name = "balanced";
     MarkedGrid(form, grid, findings, "").name = "curves";
     form.Note(KeyText("IDS_QM_UI_HINGE_PMM_NOTE"));
     form.NextColumn();

@@ -204,6 +204,9 @@ void AddPage(CFormView& form, const P& p)
             KeyTexts({"IDS_QM_UI_HINGE_GAP_BOTH", "IDS_QM_UI_HINGE_GAP_POS",
                       "IDS_QM_UI_HINGE_GAP_NEG"})),
         "", {}, [p] { return p.Slip(); });
+    Set(form.Button(KeyText("IDS_QM_UI_HINGE_TAKE_RATIOS"),
+                    [p] { p.dlg.OnDefaultAlphaBtn(p.end); }),
+        p.prefix + "defaultAlpha", [p] { return !p.Curve().useDeformation; });
     form.Columns();
     form.Flag(KeyText("IDS_QM_UI_HINGE_SYMMETRIC"), FlagOf(p, &T_SKEL_MULTI::symmetric));
     form.NextColumn();
@@ -228,11 +231,10 @@ void BuildMulti(CFormView& form, DLG& dlg)
         form.Columns();
         AddPage(form, {dlg, end, end == HINGE_END::J ? "J." : ""});
         form.NextColumn();
-        form.Picture([&dlg, end, title] {
-                return HingeBackbonePlot(dlg.m_owner.type, dlg.Which(), *dlg.Curve(end),
-                                         zql::lib::MMSGFunction::GetValue(title));
-            })
-            .name = std::string(end == HINGE_END::J ? "J." : "") + "picture";
+        AddBackbonePicture(form, [&dlg, end, title](bool box) {
+            return HingeBackbonePlot(dlg.m_owner.type, dlg.Which(), *dlg.Curve(end),
+                                     zql::lib::MMSGFunction::GetValue(title), box);
+        }).name = std::string(end == HINGE_END::J ? "J." : "") + "picture";
         form.EndColumns();
     });
     form.EndPages();

@@ -1,6 +1,7 @@
 #include "qm_ui/hinge/hingeplot.h"
 
 #include "qm_base/msgfunction.h"
+#include "qm_rps/hinge/hingelabels.h"
 #include "qm_rps/hinge/hingepreview.h"
 
 #include <array>
@@ -19,31 +20,32 @@ struct T_CURVE_ROW {
     PLOT_LINE line;
     const T_SIDES<std::vector<T_PM_POINT>> T_PM_LINES::*lines;
     const std::vector<T_PM_POINT> T_SIDES<std::vector<T_PM_POINT>>::*whole;
+    const double T_SIDES<double>::*largest;
 };
 
 constexpr std::array<T_CURVE_ROW, 4> kCurves{{
     {"My(+)", &T_YIELD_LEVEL::y, &T_SIDES<T_PM_CURVE>::pos, PLOT_LINE::Solid, &T_PM_LINES::y,
-     &T_SIDES<std::vector<T_PM_POINT>>::pos},
+     &T_SIDES<std::vector<T_PM_POINT>>::pos, &T_SIDES<double>::pos},
     {"My(-)", &T_YIELD_LEVEL::y, &T_SIDES<T_PM_CURVE>::neg, PLOT_LINE::Dash, &T_PM_LINES::y,
-     &T_SIDES<std::vector<T_PM_POINT>>::neg},
+     &T_SIDES<std::vector<T_PM_POINT>>::neg, &T_SIDES<double>::neg},
     {"Mz(+)", &T_YIELD_LEVEL::z, &T_SIDES<T_PM_CURVE>::pos, PLOT_LINE::DashDot, &T_PM_LINES::z,
-     &T_SIDES<std::vector<T_PM_POINT>>::pos},
+     &T_SIDES<std::vector<T_PM_POINT>>::pos, &T_SIDES<double>::pos},
     {"Mz(-)", &T_YIELD_LEVEL::z, &T_SIDES<T_PM_CURVE>::neg, PLOT_LINE::Dot, &T_PM_LINES::z,
-     &T_SIDES<std::vector<T_PM_POINT>>::neg},
+     &T_SIDES<std::vector<T_PM_POINT>>::neg, &T_SIDES<double>::neg},
 }};
 
-void Append(std::span<const T_PM_POINT> points, T_PLOT_SERIES& s)
+void Append(std::span<const T_PM_POINT> points, T_PLOT_SERIES& s, T_PM_POINT scale = {1.0, 1.0})
 {
     for (const T_PM_POINT& p : points) {
-        s.x.push_back(p.m);
-        s.y.push_back(p.p);
+        s.x.push_back(p.m * scale.m);
+        s.y.push_back(p.p * scale.p);
     }
 }
 
 } // namespace
 
 T_PLOT HingeBackbonePlot(const T_PHGT_D& type, HINGE_COMPONENT component, const T_SKEL_CURVE& curve,
-                         const std::string& page)
+                         const std::string& page, bool box)
 {
     const auto c = static_cast<std::size_t>(component);
     const bool moment = component >= HINGE_COMPONENT::Mx;
@@ -51,7 +53,8 @@ T_PLOT HingeBackbonePlot(const T_PHGT_D& type, HINGE_COMPONENT component, const 
     plot.title = MMSGFunction::Format("IDS_QM_PLOT_HINGE", {type.name, kComponentNames[c]});
     plot.subtitle = page;
     T_HINGE_PREVIEW preview;
-    if (!BackboneOf(curve, type.components[c].type, preview)) {
+    const auto shape = box ? PreviewOf : BackboneOf;
+    if (!shape(curve, type.components[c].type, preview)) {
         plot.notes.push_back(MMSGFunction::GetValue("IDS_QM_PLOT_NO_SHAPE"));
         return plot;
     }
@@ -60,6 +63,7 @@ T_PLOT HingeBackbonePlot(const T_PHGT_D& type, HINGE_COMPONENT component, const 
                        : MMSGFunction::GetValue(moment ? "IDS_QM_PLOT_PLASTIC_TURN"
                                                        : "IDS_QM_PLOT_PLASTIC_MOVE");
     plot.y.title = moment ? "M / My (-)" : "F / Fy (-)";
+    if (box) plot.x.range = plot.y.range = T_PLOT_RANGE{-kPreviewEdge, kPreviewEdge};
     T_PLOT_SERIES line;
     line.name = MMSGFunction::GetValue("IDS_QM_PLOT_BACKBONE");
     line.width = 2.4;
@@ -89,13 +93,15 @@ T_PLOT HingeBackbonePlot(const T_PHGT_D& type, HINGE_COMPONENT component, const 
 }
 
 T_PLOT HingeInteractionPlot(const T_PHGT_D& type, const T_YIELD_LEVEL& level,
-                            const std::string& what, const T_PM_LINES& lines)
+                            const std::string& what, const T_PM_LINES& lines,
+                            const std::optional<T_UNITS>& values)
 {
     T_PLOT plot;
     plot.title = MMSGFunction::Format("IDS_QM_PLOT_INTERACTION", {type.name});
     plot.subtitle = what;
-    plot.x.title = "M / MY,max (-)";
-    plot.y.title = MMSGFunction::GetValue("IDS_QM_PLOT_AXIAL_RATIO");
+    plot.x.title = values ? HingeHead("M", kDimMoment, *values) : "M / MY,max (-)";
+    plot.y.title = values ? HingeHead("IDS_QM_PLOT_AXIAL", kDimForce, *values)
+                          : MMSGFunction::GetValue("IDS_QM_PLOT_AXIAL_RATIO");
     T_PLOT_SERIES points; // on whole lines
     points.name = MMSGFunction::GetValue("IDS_QM_PLOT_INTERACTION_POINTS");
     points.line = PLOT_LINE::None;
@@ -108,8 +114,10 @@ T_PLOT HingeInteractionPlot(const T_PHGT_D& type, const T_YIELD_LEVEL& level,
         s.line = row.line;
         const std::vector<T_PM_POINT>& whole = lines.*row.lines.*row.whole;
         if (whole.empty()) s.marker = PLOT_MARKER::Circle;
-        Append(axis.curves.*row.side, whole.empty() ? s : points);
-        Append(whole, s);
+        const T_PM_POINT scale{values ? level.compression : 1.0,
+                               values ? axis.momentMax.*row.largest : 1.0};
+        Append(axis.curves.*row.side, whole.empty() ? s : points, scale);
+        Append(whole, s, scale);
         plot.series.push_back(std::move(s));
     }
     if (!points.x.empty()) plot.series.push_back(std::move(points));
@@ -122,13 +130,21 @@ T_PLOT UserInteractionPlot(const T_PHGT_D& type, const T_PMM_TABLE& table)
     plot.title = MMSGFunction::Format("IDS_QM_PLOT_USER_INTERACTION", {type.name});
     plot.x.title = "M / Mmax (-)";
     plot.y.title = MMSGFunction::GetValue("IDS_QM_PLOT_AXIAL_RATIO");
-    for (std::size_t i = 0; i < table.curves.size(); ++i) {
+    const auto add = [&plot](const T_PMM_CURVES::value_type& curve, std::string name,
+                             PLOT_LINE line) {
         T_PLOT_SERIES s;
-        s.name = i == 0 ? "Py-My" : "Pz-Mz";
-        s.line = i == 0 ? PLOT_LINE::Solid : PLOT_LINE::Dash;
+        s.name = std::move(name);
+        s.line = line;
         s.marker = PLOT_MARKER::Circle;
-        Append(table.curves[i], s);
+        Append(curve, s);
         plot.series.push_back(std::move(s));
+    };
+    const std::string sign = table.negative ? "(+)" : "";
+    for (std::size_t i = 0; i < table.curves.size(); ++i) {
+        const std::string name = i == 0 ? "Py-My" : "Pz-Mz";
+        add(table.curves[i], name + sign, i == 0 ? PLOT_LINE::Solid : PLOT_LINE::Dash);
+        if (table.negative)
+            add((*table.negative)[i], name + "(-)", i == 0 ? PLOT_LINE::DashDot : PLOT_LINE::Dot);
     }
     return plot;
 }

@@ -1,4 +1,5 @@
 #include "qm_base/msgfunction.h"
+#include "qm_base/textformat.h"
 #include "qm_rps/hinge/hingetypefindings.h"
 #include "qm_rps/po_hingetypelistdlg.h"
 #include "qm_rps/pushoverhingelistdlg.h"
@@ -57,6 +58,12 @@ void AddGeneral(CFormView& form, DLG& dlg)
                 KeyTexts({"IDS_QM_UI_MATL_CONCRETE", "IDS_QM_UI_MATL_STEEL",
                           "IDS_QM_UI_MATL_COMPOSITE", "IDS_QM_UI_MATL_MASONRY"}))
         .name = "material";
+    form.Note([&dlg] {
+            return MMSGFunction::Format("IDS_QM_UI_HINGE_STRENGTH_OF", {dlg.StrengthMaterials()});
+        })
+        .name = "strengthOf";
+    form.Button(KeyText("IDS_QM_UI_HINGE_OPTIONS_CMD"), [&dlg] { (void)dlg.OnBtnOptions(); }).name =
+        "options";
     form.EndGroup();
 }
 
@@ -162,15 +169,32 @@ void AddComponents(CFormView& form, DLG& dlg)
     for (int c = 0; c < 6; ++c)
         AddComponent(form, dlg, static_cast<HINGE_COMPONENT>(c));
     form.EndCells();
+    form.Button(KeyText("IDS_QM_UI_HINGE_DEFAULTS"), [&dlg] { (void)dlg.OnBtnDefaults(); }).name =
+        "defaults";
     form.EndGroup();
 }
 
-std::vector<std::string> InteractionTexts()
+/// The interaction of My (and of Fy and Fz) or of Mz.
+void AddInteraction(CFormView& form, DLG& dlg, HINGE_COMPONENT c)
 {
-    std::vector<std::string> texts;
-    for (const HINGE_INTERACTION i : kBendingInteractions)
-        texts.push_back(CPushOverHingeListDlg::InteractionText(static_cast<int>(i)));
-    return texts;
+    const bool mz = c == HINGE_COMPONENT::Mz;
+    const auto usable = [&dlg, mz, on = Enabled(dlg, PART::Interaction)] {
+        return on() && (!mz || At(dlg.Type(), HINGE_COMPONENT::Mz).active);
+    };
+    Set(form.Choice(
+            [mz] {
+                return MMSGFunction::GetValue("IDS_QM_UI_HINGE_INTERACTION") + (mz ? " Mz" : " My");
+            },
+            {[&dlg, c] { return DLG::ConvertInteraction(InteractionOf(dlg.Type(), c)); },
+             [&dlg, c](const int& i) { (void)dlg.OnSelChangeInteraction(c, i); }},
+            [&dlg, c] {
+                std::vector<std::string> texts;
+                for (std::size_t i = 0; i < OfferedInteractions(dlg.Type(), c); ++i)
+                    texts.push_back(
+                        CPushOverHingeListDlg::InteractionText(static_cast<int>(kInteractions[i])));
+                return texts;
+            }),
+        mz ? "interactionMz" : "interaction", usable, Shown(dlg, PART::Interaction));
 }
 
 /// A button that opens the editor of a part.
@@ -184,11 +208,11 @@ CFormField& AddPart(CFormView& form, DLG& dlg, PART part, const char* key, const
 void AddParts(CFormView& form, DLG& dlg)
 {
     form.Group(KeyText("IDS_QM_UI_HINGE_PARTS"));
-    Set(form.Choice(KeyText("IDS_QM_UI_HINGE_INTERACTION"),
-                    {[&dlg] { return DLG::ConvertInteraction(dlg.Type().interaction); },
-                     [&dlg](const int& i) { (void)dlg.OnSelChangeInteraction(i); }},
-                    InteractionTexts),
-        "interaction", Enabled(dlg, PART::Interaction), Shown(dlg, PART::Interaction));
+    form.Columns();
+    AddInteraction(form, dlg, HINGE_COMPONENT::My);
+    form.NextColumn();
+    AddInteraction(form, dlg, HINGE_COMPONENT::Mz);
+    form.EndColumns();
     form.Columns();
     AddPart(form, dlg, PART::YieldSurface, "IDS_QM_UI_HINGE_SURFACE_BTN", "yieldSurface",
             &DLG::OnYieldSurfaceDlgDlg);
@@ -205,6 +229,10 @@ void AddParts(CFormView& form, DLG& dlg)
     AddPart(form, dlg, PART::Masonry, "IDS_QM_UI_HINGE_MASONRY_BTN", "masonry.",
             &DLG::OnMasonryPropDlg);
     form.EndColumns();
+    Set(form.Note([&dlg] {
+        return MMSGFunction::GetValue(dlg.HingeLengthCaption()) + ": " + dlg.HingeLengthsText();
+    }),
+        "lengths", {}, Shown(dlg, PART::HingeLength));
     Set(form.Flag(KeyText("IDS_QM_UI_HINGE_WITHHOLD"),
                   {[&dlg] { return dlg.Type().withholdMzLength; },
                    [&dlg](const bool& on) { dlg.Edited().withholdMzLength = on; }}),
@@ -276,6 +304,32 @@ void AddFindings(CFormView& form, DLG& dlg)
     form.Grid(std::move(b)).name = "findings";
 }
 
+/// Initial stiffness of every page, with the length of the first element that uses the type.
+void AddStiffness(CFormView& form, DLG& dlg)
+{
+    T_GRID_BINDING b;
+    b.columns = {{KeyText("IDS_QM_UI_HINGE_COMPONENT")},
+                 {KeyText("IDS_QM_UI_HINGE_ENDS")},
+                 {KeyText("IDS_RPS_PO_PHGT_Initial_Stiffness")},
+                 {PlainLabel("K(+)")},
+                 {PlainLabel("K(-)")}};
+    const auto rows = std::make_shared<std::vector<T_STIFFNESS_ROW>>();
+    b.rows = [rows, &dlg] {
+        *rows = dlg.UpdateInitialStiffness();
+        return rows->size();
+    };
+    b.text = [rows, &dlg](std::size_t row, std::size_t c) {
+        return dlg.StiffnessCells((*rows)[row])[c];
+    };
+    form.Grid(std::move(b)).name = "stiffness";
+    form.Note([&dlg] {
+        return dlg.m_memberLength > 0.0
+                   ? HingeHead("IDS_QM_UI_HINGE_MEMBER_LENGTH", kDimLength, dlg.Owner().units) +
+                         ": " + ShortestText(dlg.m_memberLength)
+                   : MMSGFunction::GetValue("IDS_QM_UI_HINGE_NO_MEMBER");
+    });
+}
+
 void BuildType(CFormView& form, DLG& dlg)
 {
     form.Columns();
@@ -285,7 +339,11 @@ void BuildType(CFormView& form, DLG& dlg)
     AddParts(form, dlg);
     form.NextColumn();
     AddPreview(form, dlg);
+    form.Page(KeyText("IDS_QM_UI_HINGE_RULES"));
     AddFindings(form, dlg);
+    form.Page(KeyText("IDS_RPS_PO_PHGT_Initial_Stiffness"));
+    AddStiffness(form, dlg);
+    form.EndPages();
     form.EndColumns();
 }
 

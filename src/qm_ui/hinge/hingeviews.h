@@ -15,5 +15,7 @@ void RegisterHingeEuroView(CViewFactory& factory);
 void RegisterHingeInteractionViews(CViewFactory& factory);
 /// Lengths, integration points, span, masonry.
 void RegisterHingeLengthViews(CViewFactory& factory);
+/// Options of hinges and design codes of the model.
+void RegisterHingeOptionsView(CViewFactory& factory);
 /// Options of the yield strength calculation and their descriptions.
 void RegisterHingeStrengthViews(CViewFactory& factory);

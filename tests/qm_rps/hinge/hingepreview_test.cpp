@@ -32,6 +32,23 @@ TEST(HingePreview, ExtendsTheNegativeEndFirstAndThenThePositiveOne)
     ExpectLine({{-2.0 / 3, -2}, {0, 0}, {2.0 / 3, 2}}, line);
 }
 
+TEST(HingePreview, TheSmallBoxHasBothEndsAtItsEdge)
+{
+    T_SKEL_MULTI m; // slopes 1, then 0.1
+    m.sides.pos.alpha1 = m.sides.neg.alpha1 = 0.1;
+    m.useDeformation = true;
+    m.symmetric = false;
+    for (T_SKEL_MULTI_SIDE* s : {&m.sides.pos, &m.sides.neg})
+        s->P1 = 10, s->P2 = 10.5, s->D1 = 2, s->D2 = 3;
+    T_HINGE_PREVIEW p;
+    ASSERT_EQ(1, PreviewOf(m, SKEL_TYPE::Bilinear, p));
+    // (1.5, 1.05) goes on with 0.05 / 0.5 to x = 2: 1.1; the negative side mirrors it.
+    EXPECT_NEAR(2.0, p.line.back().x, 1e-12);
+    EXPECT_NEAR(1.1, p.line.back().y, 1e-12);
+    EXPECT_NEAR(-2.0, p.line.front().x, 1e-12);
+    EXPECT_NEAR(-1.1, p.line.front().y, 1e-12);
+}
+
 TEST(HingePreview, DrawsAFemaBackboneWithItsCriteria)
 {
     T_SKEL_FEMA f = ValidBackbone<T_SKEL_FEMA>();
