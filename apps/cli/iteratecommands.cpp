@@ -4,7 +4,7 @@
 #include "inputfile.h"
 #include "output.h"
 #include "qm_base/say.h"
-#include "qm_rps/factors/ulfitemchecks.h"
+#include "qm_rps/factors/checks/ulfitemchecks.h"
 #include "qm_rps/factors/ulfstageresults.h"
 #include "qm_rps/ulfiterationdochost.h"
 #include "qm_rps/unknownloadfactoriteranal.h"

@@ -3,7 +3,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_db/editscope.h"
-#include "qm_rps/factors/ulfcombinationchecks.h"
+#include "qm_rps/factors/checks/ulfcombinationchecks.h"
 
 #include <algorithm>
 

@@ -1,6 +1,6 @@
 #include "qm_rps/ulfitemdialog.h"
 
-#include "qm_rps/factors/ulfconstraintchecks.h"
+#include "qm_rps/factors/checks/ulfconstraintchecks.h"
 #include "qm_rps/factors/ulfstageplace.h"
 #include "qm_rps/ulfexplanationdlg.h"
 #include "qm_rps/unknownloadfactorresultdlg.h"

@@ -2,7 +2,7 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_db/editscope.h"
-#include "qm_rps/factors/ulfconstraintchecks.h"
+#include "qm_rps/factors/checks/ulfconstraintchecks.h"
 #include "qm_rps/factors/ulfstageplace.h"
 #include "qm_rps/factors/ulftexts.h"
 

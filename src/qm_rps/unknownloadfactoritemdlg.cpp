@@ -1,8 +1,8 @@
 #include "qm_rps/unknownloadfactoritemdlg.h"
 
 #include "qm_base/textformat.h"
+#include "qm_rps/factors/checks/ulfitemchecks.h"
 #include "qm_rps/factors/ulfcombination.h"
-#include "qm_rps/factors/ulfitemchecks.h"
 #include "qm_rps/factors/ulfstore.h"
 #include "qm_rps/ulfcalculation.h"
 

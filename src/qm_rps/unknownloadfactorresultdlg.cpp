@@ -3,8 +3,8 @@
 #include "qm_base/messagehistory.h"
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/factors/checks/ulfcombinationchecks.h"
 #include "qm_rps/factors/ulfcombination.h"
-#include "qm_rps/factors/ulfcombinationchecks.h"
 #include "qm_rps/factors/ulftexts.h"
 
 #include <filesystem>

@@ -2,7 +2,7 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
-#include "qm_rps/factors/ulfitemchecks.h"
+#include "qm_rps/factors/checks/ulfitemchecks.h"
 #include "qm_rps/factors/ulfstageplace.h"
 #include "qm_rps/factors/ulfstageresults.h"
 #include "qm_rps/factors/ulfstore.h"

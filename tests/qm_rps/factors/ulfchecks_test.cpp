@@ -3,9 +3,9 @@
 #include "twotrusses.h"
 #include "ulfdocument.h"
 
-#include "qm_rps/factors/ulfcombinationchecks.h"
-#include "qm_rps/factors/ulfconstraintchecks.h"
-#include "qm_rps/factors/ulfitemchecks.h"
+#include "qm_rps/factors/checks/ulfcombinationchecks.h"
+#include "qm_rps/factors/checks/ulfconstraintchecks.h"
+#include "qm_rps/factors/checks/ulfitemchecks.h"
 
 #include <algorithm>
 #include <cmath>

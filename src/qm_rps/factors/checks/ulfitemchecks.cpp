@@ -1,9 +1,9 @@
-#include "qm_rps/factors/ulfitemchecks.h"
+#include "qm_rps/factors/checks/ulfitemchecks.h"
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/ruletable.h"
+#include "qm_rps/factors/checks/ulfconstraintchecks.h"
 #include "qm_rps/factors/ulfcombination.h"
-#include "qm_rps/factors/ulfconstraintchecks.h"
 #include "qm_rps/factors/ulfstageplace.h"
 #include "qm_rps/factors/ulfstageproblem.h"
 

@@ -1,4 +1,4 @@
-#include "qm_rps/factors/ulfcombinationchecks.h"
+#include "qm_rps/factors/checks/ulfcombinationchecks.h"
 
 #include "qm_base/ruletable.h"
 #include "qm_db/attrctrl.h"

@@ -1,4 +1,4 @@
-#include "qm_rps/factors/ulfconstraintchecks.h"
+#include "qm_rps/factors/checks/ulfconstraintchecks.h"
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/ruletable.h"
