@@ -33,8 +33,12 @@ int CRps_UnknownLoadFactorManager::Calc_UnknownLoadFactor(int mode, int ncon, in
         if (isExact) {
             T_ULF_EXACT exact;
             if (!SolveUlfExact(problem, exact)) return 1;
-            x = std::move(exact.x);
             error = exact.unmet.empty() ? ULF_SOLVED : ULF_EQUALITIES_CONTRADICT;
+            // Of the many solutions of equations that repeat each other the objective chooses.
+            const T_ULF_PROBLEM loose{nvar, ncon, coefficients, rhs, weights, iobj, isign};
+            if (exact.rank < nvar && error == ULF_SOLVED && CheckUlfProblem(loose))
+                if (T_ULF_ANSWER best = SolveUlf(loose); !best.x.empty()) exact.x = best.x;
+            x = std::move(exact.x);
         } else {
             T_ULF_ANSWER answer = SolveUlf(problem);
             x = std::move(answer.x);

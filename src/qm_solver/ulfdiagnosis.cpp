@@ -23,23 +23,53 @@ long double Excess(const T_ULF_PROBLEM& problem, std::size_t i, std::span<const 
     return sum;
 }
 
-/// Scaled multipliers are d(y y / 2) or d|y|; both sides go back to the caller's units.
+/// What is large in the right-hand side of row i, for the solution x.
+long double RowUnit(const T_ULF_SCALED& s, std::size_t i, std::span<const double> x)
+{
+    long double size = 1.0L;
+    for (std::size_t j = 0; j < s.nVar; ++j)
+        size = std::max(size, std::fabs(s.metric[j] * x[j] / s.rhsScale));
+    return s.rowNorm[i] * s.rhsScale * size;
+}
+
 std::vector<T_ULF_HELD> HeldRows(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& s,
                                  const T_ULF_ANSWER& answer)
 {
     std::vector<T_ULF_HELD> held;
-    long double size = 1.0L;
-    for (std::size_t j = 0; j < s.nVar; ++j)
-        size = std::max(size, std::fabs(s.weight[j] * answer.x[j] / s.rhsScale));
     for (std::size_t i = 0; i < s.nCon; ++i) {
-        const long double slack =
-            -Excess(problem, i, answer.x) / (s.rowNorm[i] * s.rhsScale * size);
+        const long double slack = -Excess(problem, i, answer.x) / RowUnit(s, i, answer.x);
         if (i >= s.nEq && slack > kActiveTol) continue;
-        const long double unit = problem.objective == 2 ? 2.0L * s.rhsScale : 1.0L;
-        const long double m = -answer.multipliers[i] * unit / s.rowNorm[i];
-        held.push_back({static_cast<int>(i), static_cast<double>(m)});
+        held.push_back({static_cast<int>(i), static_cast<double>(answer.prices[i])});
     }
     return held;
+}
+
+/// Price of row i where its limit has been moved; the price of before where the two agree, which
+/// has more digits.
+std::optional<double> PriceAt(const T_ULF_PROBLEM& problem, std::size_t i, double limit,
+                              double before)
+{
+    std::vector<double> rhs(problem.rhs.begin(), problem.rhs.end());
+    rhs[i] = limit;
+    T_ULF_PROBLEM moved = problem;
+    moved.rhs = rhs;
+    const T_ULF_ANSWER answer = SolveUlf(moved);
+    if (answer.code != ULF_SOLVED && answer.code != ULF_RELAXED) return std::nullopt;
+    const auto price = static_cast<double>(answer.prices[i]);
+    constexpr double kSame = 1e-4;
+    return std::fabs(price - before) <= kSame * std::fabs(before) ? before : price;
+}
+
+/// The prices of a held row to each side.
+void PriceSides(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& s, std::span<const double> x,
+                T_ULF_HELD& held)
+{
+    constexpr long double kStep = 1e-7L; // of the row's unit: beyond kActiveTol
+    const auto i = static_cast<std::size_t>(held.index);
+    const auto step = static_cast<double>(kStep * RowUnit(s, i, x));
+    held.raised = PriceAt(problem, i, problem.rhs[i] + step, held.multiplier);
+    held.lowered = PriceAt(problem, i, problem.rhs[i] - step, held.multiplier);
+    if (held.lowered) held.lowered = 0.0 - *held.lowered;
 }
 
 /// What a factor that is held at zero would gain by crossing it.
@@ -48,15 +78,17 @@ std::vector<T_ULF_HELD> HeldSigns(const T_ULF_PROBLEM& problem, const T_ULF_SCAL
 {
     std::vector<T_ULF_HELD> held;
     for (std::size_t j = 0; s.sign != 0 && j < s.nVar; ++j) {
-        if (std::fabs(s.weight[j] * answer.x[j] / s.rhsScale) > kActiveTol) continue;
-        long double push = 0.0L; // of the rows towards the wrong sign
-        for (std::size_t i = 0; i < s.nCon; ++i)
-            push +=
-                s.sign * answer.multipliers[i] * problem.Row(i)[j] / (s.rowNorm[i] * s.weight[j]);
-        if (problem.objective == 1) push -= s.cost[j]; // the other side of |y| costs as well
-        if (!(push > kActiveTol)) continue;
-        const long double unit = problem.objective == 2 ? 2.0L * s.rhsScale : 1.0L;
-        held.push_back({static_cast<int>(j), static_cast<double>(push * unit * s.weight[j])});
+        if (std::fabs(s.metric[j] * answer.x[j] / s.rhsScale) > kActiveTol) continue;
+        long double push = 0.0L, terms = 0.0L; // of the rows towards the wrong sign
+        for (std::size_t i = 0; i < s.nCon; ++i) {
+            const long double term = -s.sign * answer.prices[i] * problem.Row(i)[j];
+            push += term;
+            terms += std::fabs(term);
+        }
+        // The other side of |y| costs as well.
+        if (problem.objective == 1) push -= problem.weights[j];
+        if (push > kActiveTol * terms)
+            held.push_back({static_cast<int>(j), static_cast<double>(push)});
     }
     return held;
 }
@@ -101,7 +133,7 @@ public:
         }
         m_problem.coefficients = m_rows;
         m_problem.rhs = m_rhs;
-        m_answer = SolveUlf(m_problem);
+        m_answer = MeetUlf(m_problem);
     }
     CPart(const CPart&) = delete;
     CPart& operator=(const CPart&) = delete;
@@ -109,6 +141,7 @@ public:
     {
         return m_answer.code >= ULF_EQUALITIES_CONTRADICT && m_answer.code <= ULF_OTHER_SIGN_ONLY;
     }
+    bool IsSolvable() const { return m_answer.code == ULF_SOLVED; }
     const T_ULF_ANSWER& Answer() const { return m_answer; }
 
 private:
@@ -153,8 +186,11 @@ int CUlfDiagnosis::Explain(const T_ULF_PROBLEM& problem, T_ULF_EXPLANATION& out)
     const T_ULF_ANSWER answer = SolveUlf(problem);
     if (answer.code != ULF_SOLVED && answer.code != ULF_RELAXED) return 0;
     const T_ULF_SCALED scaled = ScaleUlf(problem);
-    out = {answer.x, answer.certificate.objective, HeldRows(problem, scaled, answer),
-           HeldSigns(problem, scaled, answer)};
+    T_ULF_EXPLANATION e{answer.x, answer.certificate.objective, HeldRows(problem, scaled, answer),
+                        HeldSigns(problem, scaled, answer)};
+    for (T_ULF_HELD& held : e.rows)
+        if (e.rows.size() <= kUlfMostPriced) PriceSides(problem, scaled, answer.x, held);
+    out = std::move(e);
     return 1;
 }
 
@@ -211,7 +247,8 @@ T_ULF_CONFLICT CUlfDiagnosis::Conflict(const T_ULF_PROBLEM& problem,
         set.rows.push_back(static_cast<int>(i));
     {
         const CPart all(problem, set.rows, set.sign);
-        if (!all.IsContradiction()) return {ULF_CONFLICT::Solvable, {}, false};
+        if (all.IsSolvable()) return {ULF_CONFLICT::Solvable, {}, false};
+        if (!all.IsContradiction()) return {ULF_CONFLICT::NotProved, {}, false};
         set = Needed(problem, set, all.Answer());
     }
     int tried = 0;

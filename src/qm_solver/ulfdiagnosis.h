@@ -4,13 +4,19 @@
 #include "qm_solver/ulfproblem.h"
 
 #include <functional>
+#include <optional>
 #include <vector>
 
 /// A constraint at its limit and what moving the limit does.
 struct T_ULF_HELD {
     int index = 0;           // row, or unknown for a sign
     double multiplier = 0.0; // change of the objective for a unit more of the limit
+    /// The same of a row to each side, for a unit of the limit at first: where rows repeat each
+    /// other, lowering one of them costs and raising it does not. Empty: no solution is left, or
+    /// there are more than kUlfMostPriced rows.
+    std::optional<double> raised{}, lowered{};
 };
+inline constexpr std::size_t kUlfMostPriced = 200;
 
 /// The answer with what holds it. Objective: sum of |w x|, sum of (w x)^2 or largest |w x|.
 struct T_ULF_EXPLANATION {
@@ -37,7 +43,8 @@ struct T_ULF_COMPROMISE {
     double sumOfSquares = 0.0;     // of the violations divided by the length of row / weights
 };
 
-enum class ULF_CONFLICT { Found, Solvable, Cancelled, BadInput };
+/// NotProved: rows that nearly repeat each other leave open whether there is a solution.
+enum class ULF_CONFLICT { Found, Solvable, Cancelled, BadInput, NotProved };
 
 /// Rows and the sign restriction that contradict each other; without any one of them the others
 /// have a solution.
@@ -51,7 +58,8 @@ struct T_ULF_CONFLICT {
 class CUlfDiagnosis {
 public:
     /// Solves, and gives the multipliers (Karush, Kuhn and Tucker) of the answer. Where several
-    /// sets of multipliers are right (repeated rows) it is one of them. 1 done; 0 the problem can't
+    /// sets of multipliers are right (repeated rows) it is one of them; to each side there is one,
+    /// found with the limit moved by 1e-7 in the scale of ulfproblem.h. 1 done; 0 the problem can't
     /// be used or has no certified answer, `out` as it was.
     [[nodiscard]] int Explain(const T_ULF_PROBLEM& problem, T_ULF_EXPLANATION& out) const;
     /// Singular values of the matrix. 1 done; 0 the problem can't be used, `out` as it was.

@@ -90,8 +90,10 @@ void Shorten(const T_EQUATIONS& e, const T_QR& qr, const T_LONG_VECTOR& weights,
     u -= loose.cast<long double>() * shortest.solve(w.cwiseProduct(u));
 }
 
-std::vector<int> Unmet(const T_EQUATIONS& e, const T_LONG_VECTOR& weights, const T_LONG_VECTOR& x)
+/// Rows that x misses. The size of the solution is taken in unknowns that the rows feel alike.
+std::vector<int> Unmet(const T_EQUATIONS& e, const T_LONG_VECTOR& x)
 {
+    const T_LONG_VECTOR weights = e.colFactor.cwiseInverse();
     std::vector<int> rows;
     const long double size = weights.cwiseProduct(x).norm();
     for (Index i = 0; i < e.a.rows(); ++i) {
@@ -134,7 +136,7 @@ int SolveUlfExact(const T_ULF_PROBLEM& problem, T_ULF_EXACT& out)
         solved.x[j] = static_cast<double>(x(static_cast<Index>(j)));
         if (!std::isfinite(solved.x[j])) return 0;
     }
-    solved.unmet = Unmet(e, weights, x);
+    solved.unmet = Unmet(e, x);
     out = std::move(solved);
     return 1;
 }

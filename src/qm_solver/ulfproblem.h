@@ -37,9 +37,9 @@ enum ULF_CODE : int {
     ULF_NOT_CERTIFIED = 10, // an answer was found but not proved: it is not given
 };
 
-// Tolerances. Rows are compared after scaling: y = w x, each row divided by the 2-norm that it then
-// has, right-hand sides divided by the largest one that x = 0 fails to meet. They are relative to
-// the larger of 1 and the 2-norm of y, the solution in the same scale.
+// Tolerances. Rows are compared after scaling (factors/ulfscaling.h): y = m x, each row divided by
+// the 2-norm that it then has, right-hand sides divided by the largest one that x = 0 fails to
+// meet. They are relative to the larger of 1 and the 2-norm of y, the solution in the same scale.
 constexpr double kUlfFeasibleTol = 1e-11;  // violation of a row that counts as met
 constexpr double kUlfRelaxedTol = 1e-8;    // violation that is still an answer, with code 9
 constexpr double kUlfStationaryTol = 1e-9; // gradient of the Lagrangian
@@ -47,11 +47,11 @@ constexpr double kUlfGapTol = 1e-9;        // difference of primal and dual obje
 constexpr double kUlfRankTol = 1e-12;      // pivots below this part of the largest are zero
 constexpr double kUlfUnmetTol = 1e-6;      // an equation of exact mode that is not met
 constexpr double kUlfFreeWeight = 1e-3;    // stands for a zero weight, see below
+constexpr double kUlfSpread = 1e3;         // of what the rows feel of the unknowns, by weight
 
-// A zero weight: the unknown is free. It has no part in the sum of |w x| and in the largest |w x|.
-// The square sum, which is the objective 2 and decides between equal optima of 1 and 3, counts it
-// with kUlfFreeWeight times the smallest positive weight (all weights zero: all count 1), so that
-// the answer stays unique while the unknown costs next to nothing.
+// A zero weight: the unknown is free and has no part in any objective. Which of several optima is
+// given: the one with the smallest sum of (w x)^2, in which a zero weight counts as kUlfFreeWeight
+// times the smallest positive one (all weights zero: all count 1).
 
 /// 1 when the problem can be used: sizes fit, sign is -1, 0 or 1, everything is finite and no
 /// weight is negative. 0 otherwise.

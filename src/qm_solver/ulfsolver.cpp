@@ -11,6 +11,29 @@ T_ULF_ANSWER SolveUlf(const T_ULF_PROBLEM& problem)
         return unknown;
     }
     const T_ULF_SCALED scaled = ScaleUlf(problem);
-    return problem.objective == 2 ? SolveUlfSquare(problem, scaled)
-                                  : SolveUlfLinear(problem, scaled);
+    T_ULF_ANSWER answer;
+    for (const auto precision : {ULF_PRECISION::Double, ULF_PRECISION::LongDouble}) {
+        answer = problem.objective == 2 ? SolveUlfSquare(problem, scaled, precision)
+                                        : SolveUlfLinear(problem, scaled, precision);
+        // Rows that nearly repeat each other: what rounding has lost is there in longer numbers.
+        if (answer.code != ULF_NOT_CERTIFIED && answer.code != ULF_ITERATION_LIMIT) break;
+    }
+    return answer;
+}
+
+T_ULF_ANSWER MeetUlf(const T_ULF_PROBLEM& problem)
+{
+    const T_ULF_SCALED scaled = ScaleUlf(problem);
+    T_ULF_ANSWER answer;
+    for (const auto precision : {ULF_PRECISION::Double, ULF_PRECISION::LongDouble}) {
+        std::vector<long double> y;
+        answer = MeetUlf(scaled, precision, y);
+        if (answer.code == ULF_ITERATION_LIMIT) continue;
+        if (answer.code != ULF_SOLVED) break; // a contradiction, with its proof
+        const T_ULF_CERTIFICATE met =
+            CertifyUlf(problem, scaled, UnscaleUlf(scaled, y), answer.multipliers);
+        if (met.violation <= kUlfFeasibleTol) break;
+        answer.code = met.violation <= kUlfRelaxedTol ? ULF_RELAXED : ULF_NOT_CERTIFIED;
+    }
+    return answer;
 }

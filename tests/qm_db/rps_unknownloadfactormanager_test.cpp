@@ -18,9 +18,6 @@ struct T_CASE {
     T_VECTOR x; // empty: none
 };
 
-/// Two unknowns share 2 by the squares of weights 1 and 1e-3, for which 0 stands.
-const T_VECTOR kAlmostFree{2e-6 / 1.000001, 2 / 1.000001};
-
 // clang-format off
 const T_CASE kByHand[] = {
     // label                  neq rows         rhs     weights obj sign err x
@@ -37,7 +34,7 @@ const T_CASE kByHand[] = {
     {"rows that say nothing", 1, {0, 0, 0, 0}, {0, 1}, {1, 1}, 2, 0, 0, {0, 0}},
     {"repeated equality",     2, {1, 1, 2, 2}, {2, 4}, {1, 1}, 3, 1, 0, {1, 1}},
     {"equality by inequalities", 0, {1, 1, -1, -1}, {2, -2}, {1, 1}, 1, 0, 0, {1, 1}},
-    {"free unknown, square",  1, {1, 1},       {2},    {1, 0}, 2, 0, 0, kAlmostFree},
+    {"free unknown, square",  1, {1, 1},       {2},    {1, 0}, 2, 0, 0, {0, 2}},
     {"free unknown, largest", 1, {1, 1},       {2},    {1, 0}, 3, 0, 0, {0, 2}},
     {"no rows",               0, {},           {},     {1, 1}, 1, 0, 0, {0, 0}},
     {"overflowing unit mix",  1, {1e200, 1e-200}, {1e200}, {1e-150, 1e150}, 2, 0, 0, {1, 0}},
@@ -108,6 +105,43 @@ TEST(UnknownLoadFactor, HandSolvedProblemsComeOutAndBadOnesAreRefused)
         EXPECT_EQ(c.error, error) << c.label;
         for (std::size_t j = 0; j < x.size(); ++j)
             EXPECT_NEAR(c.x.empty() ? 0.0 : c.x[j], x[j], c.error == 9 ? 2e-9 : 3e-12) << c.label;
+    }
+}
+
+// x1 + 0.001 x2 = 1: the free unknown does it all, however much of it that takes.
+TEST(UnknownLoadFactor, AZeroWeightIsFreeInEveryObjective)
+{
+    for (int objective = 1; objective <= 3; ++objective)
+        for (const double small : {1e-3, 1e-6, 1.0, 1e3}) {
+            const T_CASE c{"", 1, {1, small}, {1}, {1, 0}, objective, 0, 0, {}};
+            CRps_UnknownLoadFactorManager manager;
+            int done = 0, error = 77;
+            const T_VECTOR x = Solve(manager, 1, c, done, error);
+            EXPECT_EQ(0, error) << objective << ' ' << small;
+            EXPECT_NEAR(0.0, x[0], 1e-9) << objective << ' ' << small;
+            EXPECT_NEAR(1.0, small * x[1], 1e-9) << objective << ' ' << small;
+        }
+    // Two free ones share what is left: the shortest.
+    const T_CASE two{"", 1, {1, 1, 1}, {2}, {1, 0, 0}, 2, 0, 0, {}};
+    CRps_UnknownLoadFactorManager manager;
+    int done = 0, error = 77;
+    const T_VECTOR x = Solve(manager, 1, two, done, error);
+    EXPECT_EQ(0, error);
+    for (std::size_t j = 0; j < 3; ++j)
+        EXPECT_NEAR(j == 0 ? 0.0 : 1.0, x[j], 1e-12);
+}
+
+TEST(UnknownLoadFactor, EquationsThatRepeatEachOtherLeaveTheChoiceToTheObjective)
+{
+    const T_VECTOR rows{1, 1, 2, 2}, rhs{2, 4}, weights{1, 2};
+    const T_VECTOR answers[] = {{2, 0}, {1.6, 0.4}, {4.0 / 3, 2.0 / 3}}; // as in kByHand
+    for (int objective = 1; objective <= 3; ++objective) {
+        T_VECTOR x(2, 7.0);
+        int error = 77;
+        EXPECT_EQ(1, CRps_UnknownLoadFactorManager().Calc_UnknownLoadFactor(
+                         0, 2, 2, 2, rows, rhs, x, weights, objective, 1, error));
+        for (std::size_t j = 0; j < 2; ++j)
+            EXPECT_NEAR(answers[objective - 1][j], x[j], 1e-12) << objective;
     }
 }
 

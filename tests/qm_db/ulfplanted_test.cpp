@@ -121,7 +121,8 @@ TEST(UlfPlanted, TheSimplexMethodAndTheTieBreakGiveTheSameAnswer)
 {
     ForAll([](const T_KIND& kind, const T_PLANTED& p, const std::string& what) {
         if (p.objective == 2 || kind.kind == PLANT::NearDuplicate) return;
-        const T_ULF_ANSWER a = SolveUlfFallback(p.Problem(), ScaleUlf(p.Problem()));
+        const T_ULF_ANSWER a =
+            SolveUlfFallback(p.Problem(), ScaleUlf(p.Problem()), ULF_PRECISION::Double);
         EXPECT_EQ(kind.error, a.code) << what;
         if (a.code == 0) {
             EXPECT_LE(Apart(p, p.x, a.x), kind.tol) << what;

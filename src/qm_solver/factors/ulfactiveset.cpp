@@ -5,6 +5,7 @@
 #define EIGEN_MPL2_ONLY
 #include <Eigen/Dense>
 #include <algorithm>
+#include <array>
 #include <cmath>
 #include <functional>
 
@@ -12,11 +13,12 @@ namespace {
 
 constexpr std::size_t kNone = static_cast<std::size_t>(-1);
 constexpr long double kNever = std::numeric_limits<long double>::infinity();
-constexpr double kMeetTol = 1e-12;      // a row is met in double precision; below kUlfFeasibleTol
-constexpr double kExactTol = 1e-15;     // a row is met in long double
-constexpr double kDependentTol = 1e-11; // part of a unit normal outside the active ones: none
-constexpr double kNearTol = 1e-5;       // below it the part is computed in long double
-constexpr double kRatioTol = 1e-11;     // weight of an active normal that can block a step
+constexpr double kMeetTol = 1e-12;  // a row is met in double precision; below kUlfFeasibleTol
+constexpr double kExactTol = 1e-15; // a row is met in long double
+// Part of a unit normal outside the active ones that is rounding, by precision.
+constexpr std::array<long double, 2> kDependentTol{1e-11L, 1e-15L};
+constexpr double kNearTol = 1e-5;              // below it the part is computed in long double
+constexpr double kRatioTol = 1e-11;            // weight of an active normal that can block a step
 constexpr long double kMultiplierTol = 1e-11L; // relative to the largest multiplier
 constexpr int kRefinements = 6;
 constexpr int kStepsPerRow = 60;
@@ -37,17 +39,12 @@ long double Largest(std::span<const long double> v)
     return most;
 }
 
-/// Residuals as double, for a correction of the same size.
-std::vector<double> Rounded(std::span<const long double> v)
-{
-    return {v.begin(), v.end()};
-}
-
 } // namespace
 
-CUlfActiveSet::CUlfActiveSet(const T_ULF_ROWS& rows)
-    : m_rows(rows), m_factor(rows.nVar), m_g(rows.nVar), m_y(rows.nVar), m_orient(rows.Size(), 1.0),
-      m_state(rows.Size(), 0), m_slack(rows.nWideRows), m_yFast(rows.nVar),
+CUlfActiveSet::CUlfActiveSet(const T_ULF_ROWS& rows, ULF_PRECISION precision)
+    : m_rows(rows), m_precision(precision), m_factor(MakeUlfFactor(rows.nVar, precision)),
+      m_g(rows.nVar), m_y(rows.nVar), m_orient(rows.Size(), 1.0), m_state(rows.Size(), 0),
+      m_slack(rows.nWideRows), m_yFast(rows.nVar),
       m_stepLimit(kStepsPerRow * static_cast<int>(rows.nVar + 50) +
                   10 * static_cast<int>(rows.Size()))
 {
@@ -65,7 +62,7 @@ void CUlfActiveSet::Start(std::span<const std::size_t> rows)
 {
     for (std::size_t row : rows) {
         Direct(row);
-        if (m_dir.zz > kDependentTol * kDependentTol) Activate(row, 0.0L);
+        if (!IsDependent()) Activate(row, 0.0L);
     }
     Refine();
 }
@@ -103,14 +100,14 @@ std::vector<long double> CUlfActiveSet::MultipliersOf(std::span<const double> co
 {
     const std::vector<long double> sided = OnThisSide(cost, capFactor);
     std::vector<long double> u(m_active.size()), all(m_rows.Size());
-    const std::vector<double> none(m_active.size(), 0.0);
-    std::vector<double> z, r;
+    const std::vector<long double> none(m_active.size(), 0.0);
+    std::vector<long double> z, r;
     for (int pass = 0; pass < kRefinements; ++pass) {
         std::vector<long double> rest(sided.size());
         std::transform(sided.begin(), sided.end(), rest.begin(), std::negate<>());
         for (std::size_t i = 0; i < u.size(); ++i)
             m_rows.AddTo(m_active[i], -m_orient[m_active[i]] * u[i], rest);
-        m_factor.Solve(Rounded(rest), none, z, r);
+        m_factor->Solve(rest, none, z, r);
         for (std::size_t i = 0; i < r.size(); ++i)
             u[i] += r[i];
     }
@@ -198,7 +195,7 @@ ULF_STEP CUlfActiveSet::Add(std::size_t row)
     for (bool hasTurned = false;;) {
         if (++m_steps > m_stepLimit) return ULF_STEP::Limit;
         Direct(row);
-        const bool free = m_dir.zz > kDependentTol * kDependentTol;
+        const bool free = !IsDependent();
         const long double full = free ? Violation(row) / m_dir.zz : kNever;
         const long double room = Cap(row) - multiplier;
         const T_RATIO block = DualRatio();
@@ -232,11 +229,11 @@ bool CUlfActiveSet::TurnsRound(std::size_t row)
 /// The direction of a row, in long double where little of its normal is left.
 void CUlfActiveSet::Direct(std::size_t row)
 {
-    m_factor.Direct(m_rows, row, m_orient[row], m_dir);
+    m_factor->Direct(m_rows, row, m_orient[row], m_dir);
     m_z.assign(m_dir.z.begin(), m_dir.z.end());
     m_dr.assign(m_dir.r.begin(), m_dir.r.end());
     if (m_dir.zz > kNearTol * kNearTol || m_active.empty()) return;
-    std::vector<double> dz, dr;
+    std::vector<long double> dz, dr;
     for (int pass = 0; pass < 2; ++pass) { // z + N r = normal, N' z = 0
         std::vector<long double> first(m_y.size()), second(m_active.size());
         m_rows.AddTo(row, m_orient[row], first);
@@ -246,14 +243,20 @@ void CUlfActiveSet::Direct(std::size_t row)
             m_rows.AddTo(m_active[i], -m_orient[m_active[i]] * m_dr[i], first);
             second[i] = -m_orient[m_active[i]] * m_rows.Dot(m_active[i], m_z);
         }
-        m_factor.Solve(Rounded(first), Rounded(second), dz, dr);
+        m_factor->Solve(first, second, dz, dr);
         for (std::size_t j = 0; j < dz.size(); ++j)
             m_z[j] += dz[j];
         for (std::size_t i = 0; i < dr.size(); ++i)
             m_dr[i] += dr[i];
     }
     const long double length = Norm(m_z);
-    m_dir.zz = static_cast<double>(length * length);
+    m_dir.zz = length * length;
+}
+
+bool CUlfActiveSet::IsDependent() const
+{
+    const long double tol = kDependentTol[static_cast<std::size_t>(m_precision)];
+    return !(m_dir.zz > tol * tol);
 }
 
 /// The step at which the first active row leaves: its multiplier reaches zero or its cap.
@@ -287,7 +290,7 @@ void CUlfActiveSet::Move(long double t, bool primal)
 
 void CUlfActiveSet::Activate(std::size_t row, long double multiplier)
 {
-    m_factor.Append(m_dir);
+    m_factor->Append(m_dir);
     m_active.push_back(row);
     m_u.push_back(multiplier);
     m_state[row] = 1;
@@ -316,7 +319,7 @@ void CUlfActiveSet::Drop(std::size_t at)
 {
     const std::size_t row = m_active[at];
     const bool isAtCap = m_u[at] > Cap(row) / 2;
-    m_factor.Remove(at);
+    m_factor->Remove(at);
     m_active.erase(m_active.begin() + static_cast<std::ptrdiff_t>(at));
     m_u.erase(m_u.begin() + static_cast<std::ptrdiff_t>(at));
     m_state[row] = 0;
@@ -352,8 +355,8 @@ long double CUlfActiveSet::RefineOnce()
         m_rows.AddTo(m_active[i], -m_orient[m_active[i]] * m_u[i], first);
         second[i] = -Violation(m_active[i]);
     }
-    std::vector<double> dy, du;
-    m_factor.Solve(Rounded(first), Rounded(second), dy, du);
+    std::vector<long double> dy, du;
+    m_factor->Solve(first, second, dy, du);
     for (std::size_t j = 0; j < dy.size(); ++j)
         m_y[j] += dy[j];
     for (std::size_t i = 0; i < du.size(); ++i)
@@ -388,9 +391,9 @@ bool CUlfActiveSet::Repair()
 /// Factorises the active normals anew.
 void CUlfActiveSet::Rebuild()
 {
-    m_factor.Clear();
+    m_factor->Clear();
     for (std::size_t row : m_active) {
-        m_factor.Direct(m_rows, row, m_orient[row], m_dir);
-        m_factor.Append(m_dir);
+        m_factor->Direct(m_rows, row, m_orient[row], m_dir);
+        m_factor->Append(m_dir);
     }
 }

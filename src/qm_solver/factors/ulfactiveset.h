@@ -17,7 +17,7 @@ enum class ULF_STEP { Done, Infeasible, Limit };
 /// the answer says whether it is met. State: one problem per object; `rows` must outlive it.
 class CUlfActiveSet {
 public:
-    explicit CUlfActiveSet(const T_ULF_ROWS& rows);
+    explicit CUlfActiveSet(const T_ULF_ROWS& rows, ULF_PRECISION precision = ULF_PRECISION::Double);
 
     /// g, and the factor by which the caps of the elastic rows grow. Keeps the active rows, without
     /// those whose multiplier has left its range.
@@ -54,6 +54,7 @@ private:
     ULF_STEP Add(std::size_t row);
     bool TurnsRound(std::size_t row);
     void Direct(std::size_t row);
+    bool IsDependent() const;
     T_RATIO DualRatio() const;
     void Move(long double t, bool primal);
     void Activate(std::size_t row, long double multiplier);
@@ -66,7 +67,8 @@ private:
     void Rebuild();
 
     const T_ULF_ROWS& m_rows;
-    CUlfFactor m_factor;
+    ULF_PRECISION m_precision;
+    std::unique_ptr<IUlfFactor> m_factor;
     T_ULF_DIRECTION m_dir;              // as the factor gives it
     std::vector<long double> m_z, m_dr; // the same, refined where needed
     std::vector<long double> m_g, m_y, m_u;

@@ -8,6 +8,7 @@ struct T_ULF_ANSWER {
     int code = ULF_NOT_CERTIFIED;
     std::vector<double> x;                // empty when there is none
     std::vector<long double> multipliers; // one per row, see CertifyUlf
+    std::vector<long double> prices;      // d objective / d right-hand side, in the caller's units
     std::vector<std::size_t> proof;       // codes 5 to 7: rows that together have no solution
     bool proofNeedsSign = false;          // ... and the sign restriction with them
     T_ULF_CERTIFICATE certificate;

@@ -8,8 +8,8 @@
 struct T_ULF_CERTIFICATE {
     double violation = 0.0;  // largest violation of a row or a sign, see kUlfFeasibleTol
     double stationary = 0.0; // largest miss of the multipliers
-    double gap = 0.0;       // primal less dual objective, relative to the larger of 1 and objective
-    double objective = 0.0; // in the problem's own units
+    double gap = 0.0;        // primal less dual objective, relative to the objective
+    double objective = 0.0;  // in the problem's own units
 
     /// Meets the tolerances of ulfproblem.h, rows within `rowTol`.
     bool Holds(double rowTol) const;

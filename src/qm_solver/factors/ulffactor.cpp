@@ -6,9 +6,6 @@
 
 namespace {
 
-using T_MATRIX = Eigen::Map<Eigen::MatrixXd>;
-using T_CONST_MATRIX = Eigen::Map<const Eigen::MatrixXd>;
-using T_CONST_VECTOR = Eigen::Map<const Eigen::VectorXd>;
 using Eigen::Index;
 
 Index I(std::size_t i)
@@ -16,113 +13,123 @@ Index I(std::size_t i)
     return static_cast<Index>(i);
 }
 
-T_MATRIX Square(std::vector<double>& v, std::size_t n)
+template <class T>
+using T_VECTOR_OF = Eigen::Matrix<T, Eigen::Dynamic, 1>;
+
+template <class T>
+T_VECTOR_OF<T> In(std::span<const long double> v)
 {
-    return {v.data(), I(n), I(n)};
+    return Eigen::Map<const T_VECTOR_OF<long double>>(v.data(), I(v.size())).template cast<T>();
 }
-T_CONST_MATRIX Square(const std::vector<double>& v, std::size_t n)
+template <class T>
+void Out(const T_VECTOR_OF<T>& v, std::vector<long double>& to)
 {
-    return {v.data(), I(n), I(n)};
+    to.assign(v.begin(), v.end());
 }
-T_CONST_VECTOR Vector(std::span<const double> v)
-{
-    return {v.data(), I(v.size())};
-}
-Eigen::Map<Eigen::VectorXd> Vector(std::vector<double>& v)
-{
-    return {v.data(), I(v.size())};
-}
+
+template <class T>
+class CUlfFactor : public IUlfFactor {
+    using VECTOR = T_VECTOR_OF<T>;
+    using MATRIX = Eigen::Matrix<T, Eigen::Dynamic, Eigen::Dynamic>;
+
+public:
+    explicit CUlfFactor(std::size_t nVar)
+        : m_q(MATRIX::Identity(I(nVar), I(nVar))), m_r(MATRIX::Zero(I(nVar), I(nVar)))
+    {
+    }
+    void Clear() override
+    {
+        m_count = 0;
+        m_q.setIdentity();
+    }
+    void Direct(const T_ULF_ROWS& rows, std::size_t row, double orient,
+                T_ULF_DIRECTION& to) const override
+    {
+        const Index rest = m_q.cols() - m_count;
+        VECTOR d;
+        if (const T_ULF_SHORT_ROW* s = rows.Short(row))
+            d = T(orient) * (T(s->a) * m_q.row(I(s->j)) + T(s->b) * m_q.row(I(s->k))).transpose();
+        else
+            d.noalias() = m_q.topRows(I(rows.nWide)).transpose() * Normal(rows.Wide(row), orient);
+        VECTOR r = d.head(m_count);
+        Upper().solveInPlace(r);
+        const VECTOR z = m_q.rightCols(rest) * d.tail(rest);
+        to.zz = d.tail(rest).squaredNorm();
+        Out<T>(d, to.d);
+        Out<T>(r, to.r);
+        Out<T>(z, to.z);
+    }
+    void Append(const T_ULF_DIRECTION& direction) override
+    {
+        const Index k = m_count, rest = m_q.cols() - k;
+        const VECTOR d = In<T>(direction.d);
+        const T length = d.tail(rest).norm();
+        const T alpha = d(k) > T(0) ? -length : length;
+        VECTOR v = d.tail(rest);
+        v(0) -= alpha;
+        // Q2 (I - v v' / (v' v / 2)); Q2 v = z - alpha q(k)
+        const VECTOR qv = (In<T>(direction.z) - alpha * m_q.col(k)) / (-alpha * v(0));
+        for (Index j = 0; j < rest; ++j)
+            if (v(j) != T(0))
+                m_q.col(k + j) -= v(j) * qv; // zeros are exact: unit rows at the start
+        m_r.col(k).head(k) = d.head(k);
+        m_r(k, k) = alpha;
+        ++m_count;
+    }
+    void Remove(std::size_t at) override
+    {
+        const Index last = m_count - 1;
+        for (Index j = I(at); j < last; ++j)
+            m_r.col(j).head(j + 2) = m_r.col(j + 1).head(j + 2);
+        for (Index j = I(at); j < last; ++j) {
+            Eigen::JacobiRotation<T> g;
+            T norm = 0;
+            g.makeGivens(m_r(j, j), m_r(j + 1, j), &norm);
+            m_r(j, j) = norm;
+            m_r(j + 1, j) = T(0);
+            if (j + 1 < last)
+                m_r.middleCols(j + 1, last - j - 1).applyOnTheLeft(j, j + 1, g.adjoint());
+            m_q.applyOnTheRight(j, j + 1, g);
+        }
+        --m_count;
+    }
+    void Solve(std::span<const long double> first, std::span<const long double> second,
+               std::vector<long double>& z, std::vector<long double>& r) const override
+    {
+        const VECTOR qFirst = m_q.transpose() * In<T>(first);
+        VECTOR both = qFirst; // Q' z: R^-T second, then Q2' first
+        if (m_count > 0) {
+            VECTOR head = In<T>(second);
+            const auto upper = Upper();
+            upper.transpose().solveInPlace(head);
+            both.head(m_count) = head;
+        }
+        VECTOR tail = qFirst.head(m_count) - both.head(m_count);
+        if (m_count > 0) Upper().solveInPlace(tail);
+        Out<T>(m_q * both, z);
+        Out<T>(tail, r);
+    }
+
+private:
+    auto Upper() const
+    {
+        return m_r.topLeftCorner(m_count, m_count).template triangularView<Eigen::Upper>();
+    }
+    static VECTOR Normal(std::span<const double> row, double orient)
+    {
+        return (orient * Eigen::Map<const Eigen::VectorXd>(row.data(), I(row.size())))
+            .template cast<T>();
+    }
+
+    Index m_count = 0;
+    MATRIX m_q, m_r; // of r the upper triangle
+};
 
 } // namespace
 
-CUlfFactor::CUlfFactor(std::size_t nVar) : m_nVar(nVar), m_r(nVar * nVar)
+std::unique_ptr<IUlfFactor> MakeUlfFactor(std::size_t nVar, ULF_PRECISION precision)
 {
-    Clear();
-}
-
-void CUlfFactor::Clear()
-{
-    m_count = 0;
-    m_q.assign(m_nVar * m_nVar, 0.0);
-    for (std::size_t j = 0; j < m_nVar; ++j)
-        m_q[j * m_nVar + j] = 1.0;
-}
-
-void CUlfFactor::Direct(const T_ULF_ROWS& rows, std::size_t row, double orient,
-                        T_ULF_DIRECTION& to) const
-{
-    const T_CONST_MATRIX q = Square(m_q, m_nVar);
-    const Index k = I(m_count), rest = I(m_nVar) - k;
-    to.d.resize(m_nVar);
-    to.r.resize(m_count);
-    to.z.resize(m_nVar);
-    auto d = Vector(to.d);
-    if (const T_ULF_SHORT_ROW* s = rows.Short(row))
-        d = orient * (s->a * q.row(I(s->j)) + s->b * q.row(I(s->k))).transpose();
-    else
-        d.noalias() = orient * (q.topRows(I(rows.nWide)).transpose() * Vector(rows.Wide(row)));
-    auto r = Vector(to.r);
-    r = d.head(k);
-    Square(m_r, m_nVar).topLeftCorner(k, k).triangularView<Eigen::Upper>().solveInPlace(r);
-    Vector(to.z).noalias() = q.rightCols(rest) * d.tail(rest);
-    to.zz = d.tail(rest).squaredNorm();
-}
-
-void CUlfFactor::Append(const T_ULF_DIRECTION& direction)
-{
-    T_MATRIX q = Square(m_q, m_nVar);
-    const Index k = I(m_count), rest = I(m_nVar) - k;
-    const T_CONST_VECTOR d = Vector(std::span<const double>(direction.d));
-    const double length = d.tail(rest).norm();
-    const double alpha = d(k) > 0.0 ? -length : length;
-    Eigen::VectorXd v = d.tail(rest);
-    v(0) -= alpha;
-    // Q2 (I - v v' / (v' v / 2)); Q2 v = z - alpha q(k)
-    const Eigen::VectorXd qv =
-        (Vector(std::span<const double>(direction.z)) - alpha * q.col(k)) / (-alpha * v(0));
-    for (Index j = 0; j < rest; ++j)
-        if (v(j) != 0.0) q.col(k + j) -= v(j) * qv; // zeros are exact: unit rows at the start
-    T_MATRIX r = Square(m_r, m_nVar);
-    r.col(k).head(k) = d.head(k);
-    r(k, k) = alpha;
-    ++m_count;
-}
-
-void CUlfFactor::Remove(std::size_t at)
-{
-    T_MATRIX q = Square(m_q, m_nVar), r = Square(m_r, m_nVar);
-    const Index last = I(m_count) - 1;
-    for (Index j = I(at); j < last; ++j)
-        r.col(j).head(j + 2) = r.col(j + 1).head(j + 2);
-    for (Index j = I(at); j < last; ++j) {
-        Eigen::JacobiRotation<double> g;
-        double norm = 0.0;
-        g.makeGivens(r(j, j), r(j + 1, j), &norm);
-        r(j, j) = norm;
-        r(j + 1, j) = 0.0;
-        if (j + 1 < last) r.middleCols(j + 1, last - j - 1).applyOnTheLeft(j, j + 1, g.adjoint());
-        q.applyOnTheRight(j, j + 1, g);
-    }
-    --m_count;
-}
-
-void CUlfFactor::Solve(std::span<const double> first, std::span<const double> second,
-                       std::vector<double>& z, std::vector<double>& r) const
-{
-    const T_CONST_MATRIX q = Square(m_q, m_nVar);
-    const Index k = I(m_count);
-    const auto upper = Square(m_r, m_nVar).topLeftCorner(k, k).triangularView<Eigen::Upper>();
-    const Eigen::VectorXd qFirst = q.transpose() * Vector(first);
-    Eigen::VectorXd both = qFirst; // Q' z: R^-T second, then Q2' first
-    if (k > 0) {
-        Eigen::VectorXd head = Vector(second);
-        upper.transpose().solveInPlace(head);
-        both.head(k) = head;
-    }
-    z.resize(m_nVar);
-    Vector(z).noalias() = q * both;
-    r.resize(m_count);
-    Eigen::VectorXd tail = qFirst.head(k) - both.head(k);
-    if (k > 0) upper.solveInPlace(tail);
-    Vector(r) = tail;
+    if (precision == ULF_PRECISION::LongDouble)
+        return std::make_unique<CUlfFactor<long double>>(nVar);
+    return std::make_unique<CUlfFactor<double>>(nVar);
 }

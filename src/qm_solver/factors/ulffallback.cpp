@@ -57,12 +57,12 @@ bool Release(const T_ULF_LINEAR& linear, const T_FACE& face,
 /// Smallest square sum on the face of the vertex; code 10 when it is not certified.
 void SolveOnFace(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& scaled,
                  const T_ULF_LINEAR& linear, const T_ULF_VERTEX& vertex, double heldTol,
-                 T_ULF_ANSWER& answer)
+                 ULF_PRECISION precision, T_ULF_ANSWER& answer)
 {
     std::vector<double> held = vertex.multipliers;
     for (int round = 0; round < kRounds; ++round) {
         const T_FACE face = Face(linear, held, heldTol);
-        CUlfActiveSet prices(face.rows), method(face.rows);
+        CUlfActiveSet prices(face.rows, precision), method(face.rows, precision);
         prices.Start(face.held);
         std::vector<long double> multipliers = prices.MultipliersOf(face.cost, 0.0);
         if (Release(linear, face, multipliers, held, heldTol)) continue;
@@ -75,18 +75,20 @@ void SolveOnFace(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& scaled,
 
 } // namespace
 
-T_ULF_ANSWER SolveUlfFallback(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& scaled)
+T_ULF_ANSWER SolveUlfFallback(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& scaled,
+                              ULF_PRECISION precision)
 {
     T_ULF_ANSWER answer;
     const T_ULF_LINEAR linear = LinearUlf(problem.objective, scaled);
     T_ULF_VERTEX vertex;
     if (!SolveUlfVertex(linear, vertex)) {
-        const T_ULF_ANSWER why = SolveUlfSquare(problem, scaled);
+        std::vector<long double> any;
+        const T_ULF_ANSWER why = MeetUlf(scaled, precision, any);
         const bool hasReason = why.code >= ULF_EQUALITIES_CONTRADICT && why.code < ULF_RELAXED;
         return hasReason ? why : answer;
     }
     for (double heldTol : kHeldTols) {
-        SolveOnFace(problem, scaled, linear, vertex, heldTol, answer);
+        SolveOnFace(problem, scaled, linear, vertex, heldTol, precision, answer);
         if (answer.code != ULF_NOT_CERTIFIED) break;
     }
     return answer;

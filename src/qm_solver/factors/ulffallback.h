@@ -18,4 +18,5 @@ struct T_ULF_VERTEX {
 /// Objectives 1 and 3: a vertex from the library, then the smallest square sum on the optimal face,
 /// which is held by the rows with a multiplier at the vertex. The answer needs the same certificate
 /// as any other.
-T_ULF_ANSWER SolveUlfFallback(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& scaled);
+T_ULF_ANSWER SolveUlfFallback(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& scaled,
+                              ULF_PRECISION precision);

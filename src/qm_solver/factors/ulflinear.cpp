@@ -26,7 +26,7 @@ T_ULF_LINEAR SumRows(const T_ULF_SCALED& s)
     return p;
 }
 
-/// Smallest t with |y| <= t.
+/// Smallest t with cost * |y| <= t.
 T_ULF_LINEAR LargestRows(const T_ULF_SCALED& s)
 {
     T_ULF_LINEAR p;
@@ -35,11 +35,12 @@ T_ULF_LINEAR LargestRows(const T_ULF_SCALED& s)
     p.cost[s.nVar] = 1.0;
     p.start.push_back(p.rows.Size());
     p.rows.AddShort({s.nVar, -1.0, s.nVar, 0.0});
-    const double half = std::sqrt(0.5);
     for (std::size_t j = 0; j < s.nVar; ++j) {
         if (!(s.cost[j] > 0.0)) continue;
-        if (s.sign >= 0) p.rows.AddShort({j, half, s.nVar, -half});
-        if (s.sign <= 0) p.rows.AddShort({j, -half, s.nVar, -half});
+        const double length = std::hypot(s.cost[j], 1.0);
+        const double own = s.cost[j] / length, most = -1.0 / length;
+        if (s.sign >= 0) p.rows.AddShort({j, own, s.nVar, most});
+        if (s.sign <= 0) p.rows.AddShort({j, -own, s.nVar, most});
     }
     AddUlfSigns(s, p.rows);
     return p;
@@ -52,10 +53,11 @@ T_ULF_LINEAR LinearUlf(int objective, const T_ULF_SCALED& scaled)
     return objective == 1 ? SumRows(scaled) : LargestRows(scaled);
 }
 
-T_ULF_ANSWER SolveUlfLinear(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& scaled)
+T_ULF_ANSWER SolveUlfLinear(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& scaled,
+                            ULF_PRECISION precision)
 {
     const T_ULF_LINEAR linear = LinearUlf(problem.objective, scaled);
-    CUlfActiveSet method(linear.rows);
+    CUlfActiveSet method(linear.rows, precision);
     T_ULF_ANSWER answer;
     for (double quadratic : kQuadratic) {
         std::vector<double> gradient = linear.cost;
@@ -65,8 +67,9 @@ T_ULF_ANSWER SolveUlfLinear(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& sc
         if (method.Steps() == 0) method.Start(linear.start);
         const ULF_STEP step = method.Solve(0, linear.rows.Size());
         if (step == ULF_STEP::Infeasible) {
-            T_ULF_ANSWER why = SolveUlfSquare(problem, scaled);
-            if (why.code != ULF_SOLVED && why.code != ULF_RELAXED) return why;
+            std::vector<long double> any;
+            T_ULF_ANSWER why = MeetUlf(scaled, precision, any);
+            if (why.code != ULF_SOLVED) return why;
         }
         if (step != ULF_STEP::Done) break;
         std::vector<long double> multipliers = method.MultipliersOf(linear.cost, 1.0);
@@ -75,5 +78,5 @@ T_ULF_ANSWER SolveUlfLinear(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& sc
         answer.quadratic = quadratic;
         if (answer.code != ULF_NOT_CERTIFIED) return answer;
     }
-    return SolveUlfFallback(problem, scaled);
+    return SolveUlfFallback(problem, scaled, precision);
 }

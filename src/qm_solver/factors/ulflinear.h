@@ -9,12 +9,14 @@
 /// optimum of the linear objective that has the smallest square sum (Mangasarian 1984), so it is
 /// taken as soon as its certificate for the linear objective holds. The method starts from y = 0
 /// with every |y| at its kink, which is optimal there. Otherwise the linear programming library is
-/// asked (ulffallback.h), and where there is no solution SolveUlfSquare says why.
-T_ULF_ANSWER SolveUlfLinear(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& scaled);
+/// asked (ulffallback.h), and where there is no solution MeetUlf says why.
+T_ULF_ANSWER SolveUlfLinear(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& scaled,
+                            ULF_PRECISION precision);
 
 /// The objective as rows and costs. Objective 1: sum of cost * |y|, with an elastic row per
-/// unknown where the sign is free. Objective 3: unknown nVar is the largest |y|.
+/// unknown where the sign is free. Objective 3: unknown nVar is the largest cost * |y|, in `unit`.
 struct T_ULF_LINEAR {
+    double unit = 1.0; // of the objective
     T_ULF_ROWS rows;
     std::vector<double> cost;       // one per unknown of `rows`
     std::vector<std::size_t> start; // rows that hold y = 0

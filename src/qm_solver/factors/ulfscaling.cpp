@@ -9,6 +9,9 @@ constexpr double kLargestRhs = 1e300; // beyond it a scaled right-hand side is n
 
 constexpr long double kNoise = 1e-17L; // part of the largest factor that is rounding
 
+constexpr int kSweeps = 6;                 // of the equilibration
+constexpr long double kLeastSize = 1e-40L; // of a column, against the largest, both by weight
+
 bool AllFinite(std::span<const double> values)
 {
     return std::all_of(values.begin(), values.end(), [](double v) { return std::isfinite(v); });
@@ -21,13 +24,13 @@ void ScaleRow(const T_ULF_PROBLEM& problem, std::size_t i, T_ULF_SCALED& s)
     const std::span<const double> row = problem.Row(i);
     long double sum = 0.0L;
     for (std::size_t j = 0; j < s.nVar; ++j) {
-        const long double v = row[j] / s.weight[j];
+        const long double v = row[j] / s.metric[j];
         sum += v * v;
     }
     const long double norm = sum > 0.0L ? std::sqrt(sum) : 1.0L;
     s.rowNorm[i] = norm;
     for (std::size_t j = 0; j < s.nVar; ++j)
-        s.rows[i * s.nVar + j] = static_cast<double>(row[j] / s.weight[j] / norm);
+        s.rows[i * s.nVar + j] = static_cast<double>(row[j] / s.metric[j] / norm);
 }
 
 long double RhsScale(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& s)
@@ -38,6 +41,35 @@ long double RhsScale(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& s)
         largest = std::max(largest, i < s.nEq ? std::fabs(b) : -b);
     }
     return largest > 0.0L ? std::exp2(std::floor(std::log2(largest))) : 1.0L;
+}
+
+/// Whether any row feels unknown j.
+bool IsFelt(const T_ULF_PROBLEM& p, std::size_t j)
+{
+    for (std::size_t i = 0; i < p.Rows(); ++i)
+        if (std::fabs(p.Row(i)[j]) > 0.0) return true;
+    return false;
+}
+
+/// The sizes times a common factor, see UlfColumnSizes.
+std::vector<long double> FittedToWeights(const T_ULF_PROBLEM& p, std::vector<long double> size)
+{
+    long double least = 0.0L, most = 0.0L; // of size / weight
+    for (std::size_t j = 0; j < size.size(); ++j) {
+        if (!(p.weights[j] > 0.0) || !IsFelt(p, j)) continue;
+        const long double ratio = size[j] / p.weights[j];
+        least = least > 0.0L ? std::min(least, ratio) : ratio;
+        most = std::max(most, ratio);
+    }
+    least = std::max(least, kLeastSize * most);
+    const long double unit = most > 0.0L ? std::sqrt(least) * std::sqrt(most) : 1.0L;
+    for (std::size_t j = 0; j < size.size(); ++j) {
+        const bool isWeighted = p.weights[j] > 0.0;
+        const long double own = isWeighted ? p.weights[j] : 1.0L;
+        size[j] =
+            IsFelt(p, j) ? std::max(size[j] / unit, isWeighted ? kLeastSize * own : 0.0L) : own;
+    }
+    return size;
 }
 
 } // namespace
@@ -65,16 +97,54 @@ std::vector<long double> UlfWeights(std::span<const double> weights)
     return all;
 }
 
+std::vector<long double> UlfColumnSizes(const T_ULF_PROBLEM& p)
+{
+    const auto n = static_cast<std::size_t>(p.nVar);
+    std::vector<long double> row(p.Rows(), 1.0L), size(n, 1.0L);
+    for (int sweep = 0; sweep < kSweeps; ++sweep) {
+        for (std::size_t i = 0; i < p.Rows(); ++i) {
+            long double most = 0.0L;
+            for (std::size_t j = 0; j < n; ++j)
+                most = std::max(most, std::fabs(p.Row(i)[j] / size[j]));
+            row[i] = most > 0.0L ? most : 1.0L;
+        }
+        for (std::size_t j = 0; j < n; ++j) {
+            long double most = 0.0L;
+            for (std::size_t i = 0; i < p.Rows(); ++i)
+                most = std::max(most, std::fabs(p.Row(i)[j] / row[i]));
+            size[j] = most > 0.0L ? most : 1.0L;
+        }
+    }
+    return FittedToWeights(p, std::move(size));
+}
+
 T_ULF_SCALED ScaleUlf(const T_ULF_PROBLEM& problem)
+{
+    std::vector<long double> weights = UlfWeights(problem.weights);
+    std::vector<long double> sizes = UlfColumnSizes(problem);
+    long double least = 0.0L, most = 0.0L;
+    for (std::size_t j = 0; j < sizes.size(); ++j) {
+        const bool isFree = !(problem.weights[j] > 0.0);
+        const long double size = sizes[j] / weights[j] * (isFree ? kUlfFreeWeight : 1.0);
+        least = j == 0 ? size : std::min(least, size);
+        most = std::max(most, size);
+    }
+    const bool spreads = most > kUlfSpread * least;
+    return ScaleUlf(problem, spreads ? std::move(sizes) : std::move(weights));
+}
+
+T_ULF_SCALED ScaleUlf(const T_ULF_PROBLEM& problem, std::vector<long double> metric)
 {
     T_ULF_SCALED s;
     s.nVar = static_cast<std::size_t>(problem.nVar);
     s.nCon = problem.Rows();
     s.nEq = static_cast<std::size_t>(problem.nEq);
     s.sign = problem.sign;
-    s.weight = UlfWeights(problem.weights);
-    for (double w : problem.weights)
-        s.cost.push_back(w > 0.0 ? 1.0 : 0.0);
+    s.metric = std::move(metric);
+    for (std::size_t j = 0; j < s.nVar; ++j) {
+        s.cost.push_back(static_cast<double>(problem.weights[j] / s.metric[j]));
+        s.isByWeight &= s.cost[j] == 1.0 || s.cost[j] == 0.0; // w / w is exactly 1
+    }
     s.rows.resize(s.nCon * s.nVar);
     s.rowNorm.resize(s.nCon);
     for (std::size_t i = 0; i < s.nCon; ++i)
@@ -98,7 +168,7 @@ std::vector<double> UnscaleUlf(const T_ULF_SCALED& scaled, std::span<const long 
         const bool isNoise = std::fabs(y[j]) <= kNoise * size;
         const bool isPastSign = scaled.sign * y[j] < 0.0L; // within the tolerance of a row
         if (!isNoise && !isPastSign)
-            x[j] = static_cast<double>(y[j] * scaled.rhsScale / scaled.weight[j]);
+            x[j] = static_cast<double>(y[j] * scaled.rhsScale / scaled.metric[j]);
     }
     return x;
 }

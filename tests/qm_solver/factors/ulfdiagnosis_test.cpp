@@ -95,6 +95,40 @@ TEST(UlfDiagnosis, AnAnswerWorkedByHandIsExplained)
     EXPECT_NEAR(2.0, e.signs[0].multiplier, 1e-13);
 }
 
+// Smallest x^2 with x >= 1 twice: the objective is b^2, and only both bounds together let it fall.
+TEST(UlfDiagnosis, ABoundThatStandsTwiceCostsToOneSideAlone)
+{
+    const T_VECTOR rows{-1, -1}, rhs{-1, -1}, weights{1};
+    for (const int objective : {1, 2, 3}) {
+        T_ULF_EXPLANATION e;
+        ASSERT_EQ(1, CUlfDiagnosis().Explain({1, 0, rows, rhs, weights, objective, 0}, e));
+        ASSERT_EQ(2u, e.rows.size());
+        for (const T_ULF_HELD& held : e.rows) {
+            EXPECT_NEAR(0.0, held.raised.value(), 1e-12) << objective;
+            EXPECT_NEAR(objective == 2 ? 2.0 : 1.0, held.lowered.value(), 1e-6) << objective;
+        }
+    }
+    // An equality that stands twice can't be moved alone; one that stands once goes both ways.
+    T_ULF_EXPLANATION e;
+    ASSERT_EQ(1, CUlfDiagnosis().Explain({1, 2, rows, rhs, weights, 2, 0}, e));
+    EXPECT_FALSE(e.rows.at(0).raised || e.rows.at(1).lowered);
+    ASSERT_EQ(1,
+              CUlfDiagnosis().Explain({1, 1, {rows.data(), 1}, {rhs.data(), 1}, weights, 2, 0}, e));
+    EXPECT_NEAR(-2.0, e.rows.at(0).raised.value(), 1e-12);
+    EXPECT_NEAR(2.0, e.rows.at(0).lowered.value(), 1e-12);
+}
+
+// x1 + x2 = 0, x1 + (1 + d) x2 = 1, x1 + (1 + 2 d) x2 = 0 contradict each other for any d above 0.
+TEST(UlfDiagnosis, NearlyParallelRowsAreNotCalledSolvable)
+{
+    for (const double d : {1e-4, 1e-6, 1e-8, 1e-10}) {
+        const T_VECTOR rows{1, 1, 1, 1 + d, 1, 1 + 2 * d}, rhs{0, 1, 0}, weights{1, 1};
+        const ULF_CONFLICT state =
+            CUlfDiagnosis().Conflict({2, 3, rows, rhs, weights, 2, 0}, {}).state;
+        EXPECT_EQ(d > 1e-7 ? ULF_CONFLICT::Found : ULF_CONFLICT::NotProved, state) << d;
+    }
+}
+
 TEST(UlfDiagnosis, TheMatrixIsRankedWithoutRegardToUnits)
 {
     // unit rows (1, 0, 0), (0.6, 0.8, 0) times units; singular values^2 = 1 +- 0.6
