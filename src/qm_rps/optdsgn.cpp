@@ -5,6 +5,7 @@
 #include "qm_base/testenvmgr.h"
 #include "qm_db/rps_unknownloadfactormanager.h"
 #include "qm_rps/factors/optdump.h"
+#include "qm_solver/ulfproblem.h"
 
 #include <algorithm>
 #include <cmath>
@@ -110,6 +111,28 @@ T_OPT_SYSTEM SystemOf(const std::vector<T_OPT_ROW>& rows, const T_OPT_PROBLEM& p
     return s;
 }
 
+/// Factors of equations whose part in every row is rounding are exactly zero, as those that the
+/// optimum mode gives.
+void ClearNoise(T_OPT_ANSWER& answer)
+{
+    const T_OPT_SYSTEM& s = answer.system;
+    const auto part = [&](std::size_t row, std::size_t j) {
+        return std::fabs(s.matrix[row * answer.factors.size() + j] * answer.factors[j]);
+    };
+    for (std::size_t j = 0; j < answer.factors.size(); ++j) {
+        bool isNoise = false;
+        for (std::size_t row = 0; row < s.rhs.size(); ++row) {
+            double size = std::fabs(s.rhs[row]);
+            for (std::size_t k = 0; k < answer.factors.size(); ++k)
+                size = std::max(size, part(row, k));
+            if (!(part(row, j) > 0.0)) continue; // not felt
+            isNoise = part(row, j) <= kUlfFeasibleTol * size;
+            if (!isNoise) break;
+        }
+        if (isNoise) answer.factors[j] = 0.0;
+    }
+}
+
 /// The first factor with the wrong sign fails the run.
 int CheckSigns(int isign, const T_SIGN_KEYS& keys, T_OPT_ANSWER& answer)
 {
@@ -205,6 +228,7 @@ int COptDsgn::CallSolver(const T_OPT_PROBLEM& problem, T_OPT_ANSWER& answer)
 int COptDsgn::SolveExact(const T_OPT_PROBLEM& problem, T_OPT_ANSWER& answer)
 {
     CallSolver(problem, answer); // its return is not used, on purpose: residuals tell what holds
+    ClearNoise(answer);
     return CheckSigns(problem.isign, kExactSign, answer);
 }
 

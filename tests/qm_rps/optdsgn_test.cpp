@@ -284,6 +284,8 @@ TEST_F(OptDsgn, ExactModeIgnoresTheReturnAndChecksSigns)
         {1, {1, -1}, "IDS_RPS_Load_factor___d__can_be_determined_in_nega", 2},
         {-1, {1, -1}, "IDS_RPS_Load_factor___d__can_be_determined_in_posi", 1},
         {1, {0.0, -0.0}, "", 0},
+        {1, {1, -1e-17}, "", 0}, // rounding of a factor that is zero
+        {1, {1, -1e-9}, "IDS_RPS_Load_factor___d__can_be_determined_in_nega", 2},
     };
     for (const auto& c : kCases)
         Expect(c.key, c.number, Problem(rows, c.isign, false), Answering(m_handed, c.x, 5, 0));
