@@ -4,7 +4,9 @@
 #include "inputfile.h"
 #include "output.h"
 #include "qm_base/say.h"
+#include "qm_base/textformat.h"
 #include "qm_rps/factors/checks/ulfitemchecks.h"
+#include "qm_rps/factors/checks/ulfstagechecks.h"
 #include "qm_rps/factors/ulfstageresults.h"
 #include "qm_rps/ulfiterationdochost.h"
 #include "qm_rps/unknownloadfactoriteranal.h"
@@ -30,6 +32,7 @@ public:
     void Solved(const T_ULF_ITER_STEP&, const std::optional<T_FINDING>&) override {}
     ULF_ITER_WISH Wish(const T_ULF_ITER_STEP&) override { return ULF_ITER_WISH::Iterate; }
     bool MayOverwrite(const std::string&) override { return m_overwrite; }
+    bool MayReplace(const std::string&) override { return m_overwrite; }
     bool GoesOn(int done, int required) override
     {
         if (done != m_shown && isatty(STDERR_FILENO)) {
@@ -73,12 +76,24 @@ T_END_WORDS WordsOfEnd(ULF_ITER_END end)
     return kEnds[0];
 }
 
-T_END_WORDS WordsOf(const CUlfIteration& run, const T_ITERATE_OPTIONS& o, bool met)
+/// What a run has left beside its history.
+struct T_ITERATE_RESULT {
+    bool met = false;                     // the factors meet the constraints
+    std::vector<T_ULF_ANALYSED> analysed; // of the last copy; empty where nothing was applied
+    std::vector<T_ULF_STAY> stays;
+    T_UNITS units;
+    bool linearForecast = false;
+};
+
+T_END_WORDS WordsOf(const CUlfIteration& run, const T_ITERATE_OPTIONS& o, const T_ITERATE_RESULT& r)
 {
     const bool done = run.End() == ULF_ITER_END::Required ? o.iterations == 0
                                                           : run.End() == ULF_ITER_END::Converged;
-    if (done && !met)
+    if (done && !r.met)
         return {run.End(), "constraints not met", "IDS_QM_CLI_CONSTRAINTS_NOT_MET",
+                EXIT_CODE::NotFound};
+    if (done && !std::ranges::all_of(r.analysed, &T_ULF_ANALYSED::Agrees))
+        return {run.End(), "analysed structure differs", "IDS_QM_CLI_ANALYSED_DIFFERS",
                 EXIT_CODE::NotFound};
     if (run.End() == ULF_ITER_END::Required && o.iterations == 0)
         return {run.End(), "solved", "IDS_QM_CLI_SOLVED", EXIT_CODE::Done};
@@ -101,7 +116,32 @@ void Write(CJsonText& w, const T_ULF_ITER_STEP& step)
     w.End();
 }
 
-std::string HistoryJson(const CUlfIteration& run, const char* status)
+void Write(CJsonText& w, const T_ITERATE_RESULT& r)
+{
+    w.Key("analysed").List({2, 1, true});
+    for (const T_ULF_ANALYSED& a : r.analysed) {
+        w.Object(kJsonOneLine);
+        w.Member("name", a.name).Member("place", a.place).Member("unit", a.unit);
+        w.Member("forecast", a.forecast + 0.0).Member("analysed", a.analysed + 0.0);
+        w.Member("allowed", a.allowed).Member("agrees", a.Agrees());
+        w.End();
+    }
+    w.End();
+    w.Key("stays").List({2, 1, true});
+    for (const T_ULF_STAY& s : r.stays) {
+        w.Object(kJsonOneLine);
+        w.Member("element", s.element).Member("case", s.load);
+        w.Member("unit", std::string(NameOf(r.units.force)));
+        w.Member("start", s.start).Member("factor", s.Factor()).Member("pretension", s.now);
+        w.Member("force", s.force);
+        w.End();
+    }
+    w.End();
+    w.Member("linear_forecast", r.linearForecast);
+}
+
+std::string HistoryJson(const CUlfIteration& run, const T_ITERATE_RESULT& result,
+                        const char* status)
 {
     CJsonText w(JSON_REALS::Shortest);
     w.Object({1, 0});
@@ -111,6 +151,7 @@ std::string HistoryJson(const CUlfIteration& run, const char* status)
         Write(w, step);
     w.End();
     w.Items("applied", UlfIterApplied(run.History()), kJsonOneLine);
+    Write(w, result);
     w.End();
     return w.Text();
 }
@@ -133,6 +174,45 @@ void PrintHistory(const CUlfIteration& run)
                     Say(rows[i].pretension ? "IDS_QM_CLI_YES" : "IDS_QM_CLI_NO").c_str());
 }
 
+/// Start, factor and final pretension of each stay, and its force in the last stage.
+void PrintStays(const T_ITERATE_RESULT& r)
+{
+    if (r.stays.empty()) return;
+    const std::string unit(NameOf(r.units.force));
+    const auto in = [&](const char* key) { return Say(key) + " " + unit; };
+    std::printf("\n%8s  %-16s %16s %12s %16s %16s\n", Say("IDS_QM_CLI_ELEMENT").c_str(),
+                Say("IDS_QM_CLI_LOAD_CASE").c_str(), in("IDS_QM_CLI_STAY_START").c_str(),
+                Say("IDS_QM_CLI_FACTOR").c_str(), in("IDS_QM_CLI_STAY_NOW").c_str(),
+                in("IDS_QM_CLI_STAY_FORCE").c_str());
+    const auto text = [](const std::optional<double>& v) {
+        return v ? FormatText("%.7g", *v + 0.0) : std::string("-");
+    };
+    for (const T_ULF_STAY& s : r.stays)
+        std::printf("%8d  %-16s %16s %12s %16s %16s\n", s.element, s.load.c_str(),
+                    text(s.start).c_str(), text(s.Factor()).c_str(), text(s.now).c_str(),
+                    text(s.force).c_str());
+}
+
+void PrintAnalysed(const T_ITERATE_RESULT& r)
+{
+    if (r.analysed.empty()) return;
+    std::size_t width = 10;
+    for (const T_ULF_ANALYSED& a : r.analysed)
+        width = std::max(width, UlfNameAt(a.name, a.place).size());
+    const int columns = static_cast<int>(width);
+    std::printf("\n%-*s %15s %15s %13s %-6s %s\n", columns, Say("IDS_QM_CLI_CONSTRAINT").c_str(),
+                Say("IDS_QM_CLI_FORECAST").c_str(), Say("IDS_QM_CLI_ANALYSED").c_str(),
+                Say("IDS_QM_CLI_DIFFERENCE").c_str(), Say("IDS_QM_CLI_UNIT").c_str(),
+                Say("IDS_QM_CLI_STATE").c_str());
+    for (const T_ULF_ANALYSED& a : r.analysed) {
+        std::printf("%-*s %15.7g %15.7g %13.3g %-6s %s\n", columns,
+                    UlfNameAt(a.name, a.place).c_str(), a.Shown(a.forecast), a.Shown(a.analysed),
+                    a.Shown(a.analysed - a.forecast), a.unit.c_str(),
+                    Say(a.Agrees() ? "IDS_QM_CLI_AGREES" : "IDS_QM_CLI_DIFFERS").c_str());
+    }
+    if (r.linearForecast) std::printf("%s\n", Say("IDS_QM_ULF_LINEAR_FORECAST").c_str());
+}
+
 EXIT_CODE CheckOptions(const T_ITERATE_OPTIONS& o)
 {
     CUnknownLoadFactorIterAnal trial;
@@ -143,24 +223,64 @@ EXIT_CODE CheckOptions(const T_ITERATE_OPTIONS& o)
     if (const EXIT_CODE code = CheckPlotName(o.plot); code != EXIT_CODE::Done) return code;
     const std::string report = UlfIterReportPath(o.file);
     std::error_code ignored;
+    if (std::filesystem::equivalent(report, o.file, ignored))
+        return Complain(EXIT_CODE::Usage, o.file + ": " + Say("IDS_QM_CLI_REPORT_IS_INPUT"));
+    for (int i = 1; i <= o.iterations && !o.overwrite; ++i)
+        if (const std::string copy = UlfIterCopyPath(o.file, i);
+            std::filesystem::exists(copy, ignored))
+            return Complain(EXIT_CODE::NoAccess, copy + ": " + Say("IDS_QM_CLI_COPY_THERE"));
     if (!o.overwrite && !o.append && std::filesystem::exists(report, ignored))
         return Complain(EXIT_CODE::NoAccess, report + ": " + Say("IDS_QM_CLI_REPORT_THERE"));
     return EXIT_CODE::Done;
 }
 
-EXIT_CODE WriteResults(const CUlfIteration& run, const T_ITERATE_OPTIONS& o, const char* status)
+EXIT_CODE WriteResults(const CUlfIteration& run, const T_ITERATE_OPTIONS& o,
+                       const T_ITERATE_RESULT& result, const char* status)
 {
     if (!o.json.empty()) {
-        const EXIT_CODE code = WriteOutput(o.json, HistoryJson(run, status));
+        const EXIT_CODE code = WriteOutput(o.json, HistoryJson(run, result, status));
         if (code != EXIT_CODE::Done) return code;
     }
-    if (o.json != "-") PrintHistory(run);
+    if (o.json != "-") {
+        PrintHistory(run);
+        PrintStays(result);
+        PrintAnalysed(result);
+    }
 #ifdef QM_UI
     if (!o.plot.empty() && !run.History().empty())
         return WritePicture(IterationPlot(o.item, {o.iterations, o.tolerance}, run.History()),
                             o.plot);
 #endif
     return EXIT_CODE::Done;
+}
+
+/// Finds the item and says what is wrong with it, and what is worth a warning.
+EXIT_CODE FindItem(CDBDoc& doc, const T_ITERATE_OPTIONS& o, T_ULSI_D& item)
+{
+    int key = 0;
+    if (!doc.Attr().FindUlsi(o.item, key))
+        return Complain(EXIT_CODE::Usage, o.file + ": " + Say("IDS_QM_CLI_NO_STAGE_ITEM", o.item));
+    item = doc.Data().Model().ulfStageItems.at(key);
+    item.sumStageLoads |= o.sumStageLoads;
+    if (const auto findings = CheckUlfStageItem(item, key, doc.Data()); !findings.empty())
+        return Complain(EXIT_CODE::BadInput, o.file + ": " + findings.front().text);
+    for (const T_FINDING& f : UlfStageItemWarnings(item, doc.Data()))
+        Complain(EXIT_CODE::Done, o.file + ": " + Say("IDS_QM_CLI_ULF_WARNING", f.text));
+    return EXIT_CODE::Done;
+}
+
+T_ITERATE_RESULT ResultOf(const CDBDoc& doc, CUlfIterationDocHost& host, const CUlfIteration& run,
+                          double tolerance)
+{
+    T_ITERATE_RESULT r;
+    r.units = doc.Data().Units();
+    if (!host.Result()) return r;
+    r.met = std::ranges::all_of(UlfResultRows(*host.Result()), &T_ULF_RESULT_ROW::met);
+    r.linearForecast = host.Result()->linearForecast;
+    if (run.History().size() < 2) return r; // nothing was applied
+    r.analysed = host.Analysed(tolerance);
+    r.stays = host.Stays();
+    return r;
 }
 
 } // namespace
@@ -170,15 +290,11 @@ EXIT_CODE RunUlfIterate(const T_ITERATE_OPTIONS& o)
     if (const EXIT_CODE code = CheckOptions(o); code != EXIT_CODE::Done) return code;
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
-    int key = 0;
-    if (!doc.Attr().FindUlsi(o.item, key))
-        return Complain(EXIT_CODE::Usage, o.file + ": " + Say("IDS_QM_CLI_NO_STAGE_ITEM", o.item));
-    const T_ULSI_D item = doc.Data().Model().ulfStageItems.at(key);
-    if (const auto findings = CheckUlfStageItem(item, key, doc.Data()); !findings.empty())
-        return Complain(EXIT_CODE::BadInput, o.file + ": " + findings.front().text);
+    T_ULSI_D item;
+    if (const EXIT_CODE code = FindItem(doc, o, item); code != EXIT_CODE::Done) return code;
     if (const EXIT_CODE code = AnalyseStages(doc, o.file); code != EXIT_CODE::Done) return code;
 
-    CUlfIterationDocHost host(doc, item, o.sumStageLoads);
+    CUlfIterationDocHost host(doc, item);
     CIteratePerson person(o.overwrite);
     CUnknownLoadFactorIterAnal* settings = CUnknownLoadFactorIterAnal::Of(doc.DynModules());
     if (!settings || !settings->Set({o.iterations, o.tolerance}))
@@ -187,15 +303,15 @@ EXIT_CODE RunUlfIterate(const T_ITERATE_OPTIONS& o)
     const CInterrupt interrupt;
     const int done = run.Run();
     if (isatty(STDERR_FILENO) && run.History().size() > 1) std::fprintf(stderr, "\n");
-    const auto& result = host.Result();
-    const bool met = result && std::ranges::all_of(UlfResultRows(*result), &T_ULF_RESULT_ROW::met);
+    const T_ITERATE_RESULT result = ResultOf(doc, host, run, o.tolerance);
     const T_END_WORDS words =
-        host.IsSaveRefused() ? WordsOfEnd(ULF_ITER_END::NotSaved) : WordsOf(run, o, met);
+        host.IsSaveRefused() ? WordsOfEnd(ULF_ITER_END::NotSaved) : WordsOf(run, o, result);
     const std::string said = run.Said() ? run.Said()->text : std::string();
     const std::string reason = host.Error().empty() ? said : host.Error();
     if (!done || words.code != EXIT_CODE::Done)
-        Complain(words.code, Say("IDS_QM_CLI_FILE_ITEM", o.file, o.item) + ": " + Say(words.key) +
-                                 (reason.empty() ? "" : ": " + reason));
-    const EXIT_CODE written = WriteResults(run, o, words.status);
+        Complain(words.code,
+                 Say("IDS_QM_CLI_FILE_ITEM", o.file, o.item) + ": " + Say(words.key) +
+                     (reason.empty() ? "" : ": " + reason));
+    const EXIT_CODE written = WriteResults(run, o, result, words.status);
     return words.code == EXIT_CODE::Done ? written : words.code;
 }

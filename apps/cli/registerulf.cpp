@@ -19,6 +19,11 @@ void AddSum(CLI::App* sub, bool& sumStageLoads)
     sub->add_flag("--sum-stage-loads", sumStageLoads, Say("IDS_QM_HELP_ULF_SUM"));
 }
 
+void AddForce(CLI::App* sub, const OPTIONS& o)
+{
+    sub->add_flag("--force", o->force, Say("IDS_QM_HELP_ULF_FORCE"));
+}
+
 void AddSolve(const T_GROUP& group, const OPTIONS& o)
 {
     auto* solve = AddOne(group, "solve", Say("IDS_QM_HELP_ULF_SOLVE"),
@@ -27,6 +32,7 @@ void AddSolve(const T_GROUP& group, const OPTIONS& o)
     AddJson(solve, o->json, Say("IDS_QM_HELP_ULF_SOLVE_JSON"));
     solve->add_option("--plot", o->plot, Say("IDS_QM_HELP_ULF_SOLVE_PLOT"));
     AddSum(solve, o->sumStageLoads);
+    solve->add_flag("--dump", o->dump, Say("IDS_QM_HELP_ULF_DUMP"));
     solve->add_option("--shape-plot", o->shapePlot, Say("IDS_QM_HELP_ULF_SHAPE_PLOT"));
     AddOverwrite(solve, o->overwrite);
 }
@@ -75,6 +81,8 @@ void AddUlf(CLI::App& app, EXIT_CODE& code)
     AddSum(sheet, o->sumStageLoads);
     sheet->add_option("-o", o->out, Say("IDS_QM_HELP_ULF_SHEET"))->required();
     AddOverwrite(sheet, o->overwrite);
+    AddForce(sheet, o);
+    sheet->add_flag("--open", o->open, Say("IDS_QM_HELP_ULF_OPEN"));
     sheet->add_option("--date", o->date, Say("IDS_QM_HELP_ULF_DATE"));
     sheet->add_option("--sheet-version", o->sheetVersion, Say("IDS_QM_HELP_ULF_SHEET_VERSION"))
         ->capture_default_str();
@@ -84,4 +92,5 @@ void AddUlf(CLI::App& app, EXIT_CODE& code)
     combine->add_option("--name", o->name, Say("IDS_QM_HELP_ULF_NAME"))->required();
     combine->add_option("-o", o->out, Say("IDS_QM_HELP_ULF_OUT"));
     AddOverwrite(combine, o->overwrite);
+    AddForce(combine, o);
 }

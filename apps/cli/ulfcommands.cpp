@@ -42,12 +42,17 @@ EXIT_CODE OpenAndAnalyse(const T_ULF_OPTIONS& o, T_ULF_OPENED& in)
     return code == EXIT_CODE::Done ? AnalyseForUlf(o.file, in) : code;
 }
 
-/// Solves; a refusal or a missing solution is told on stderr.
+/// Solves for factors that are to be written; a refusal, a missing solution and constraints that
+/// are not met are told on stderr.
 EXIT_CODE SolveOpened(const T_ULF_OPTIONS& o, T_ULF_OPENED& in)
 {
     const T_ULF_OUTCOME outcome = SolveUlf(*in.dialog);
-    if (outcome.code != EXIT_CODE::Done) Complain(outcome.code, ItemOf(o) + ": " + outcome.message);
-    return in.dialog->Result() ? EXIT_CODE::Done : outcome.code;
+    if (outcome.code == EXIT_CODE::Done) return EXIT_CODE::Done;
+    const bool isForced = in.dialog->Result() && o.force;
+    const bool isKept = in.dialog->Result() && !o.force;
+    Complain(outcome.code, ItemOf(o) + ": " + outcome.message +
+                               (isKept ? " " + Say("IDS_QM_CLI_ULF_FORCE") : std::string()));
+    return isForced ? EXIT_CODE::Done : outcome.code;
 }
 
 #ifdef QM_UI
@@ -130,7 +135,7 @@ void ListItem(CDBDoc& doc, int key, const T_ULFI_D& item)
               item.solveByEquations);
 }
 
-void ListStageItem(const T_ULSI_D& item)
+void ListStageItem(CDBDoc& doc, int key, const T_ULSI_D& item)
 {
     const auto unknown = std::ranges::count_if(item.rows, &T_ULSI_ROW::unknown);
     const auto scaling = std::ranges::count_if(item.rows, &T_ULSI_ROW::pretension);
@@ -138,6 +143,10 @@ void ListStageItem(const T_ULSI_D& item)
                   std::to_string(item.rows.size()), std::to_string(scaling),
                   std::to_string(item.constraints.size())),
               item.solveByEquations);
+    for (const auto& row : CUnknownStageItemDlg(doc, key).Summary())
+        std::printf("  %s\n", Say("IDS_QM_UI_ULF_SUMMARY", Say(std::string(row.key).c_str()),
+                                  std::to_string(row.unknowns), std::to_string(row.rows))
+                                  .c_str());
 }
 
 EXIT_CODE LastMessage(const zql::frx::MDialog& dialog, EXIT_CODE code, const std::string& file)
@@ -156,13 +165,17 @@ EXIT_CODE RunUlfList(const T_ULF_OPTIONS& o)
     const T_MODEL& model = doc.Data().Model();
     for (const auto& [key, item] : model.ulfItems)
         ListItem(doc, key, item);
-    for (const auto& entry : model.ulfStageItems)
-        ListStageItem(entry.second);
+    for (const auto& [key, item] : model.ulfStageItems)
+        ListStageItem(doc, key, item);
     for (const auto& entry : model.ulfConstraints) {
         T_ULFC_D c;
         if (!doc.Attr().GetUlfc(entry.first, c)) continue;
         const std::string place = UlfPlaceText(doc.Data(), c.stage, c.step);
-        std::printf("  %s: %s\n", UlfNameAt(c.name, place).c_str(), UlfDescription(c).c_str());
+        const bool bounded = c.inequality || c.compareWithValue; // else there is no number
+        const std::string unit =
+            bounded ? " " + UlfUnitText(c.type, c.component, doc.Unit().Units()) : std::string();
+        std::printf("  %s: %s%s\n", UlfNameAt(c.name, place).c_str(), UlfDescription(c).c_str(),
+                    unit.c_str());
     }
     const std::size_t items = model.ulfItems.size() + model.ulfStageItems.size();
     std::printf("%s\n", Say("IDS_QM_CLI_ULF_COUNTS", std::to_string(items),
@@ -175,13 +188,18 @@ EXIT_CODE RunUlfCheck(const T_ULF_OPTIONS& o)
 {
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
-    std::size_t items = 0, findings = 0;
+    std::size_t items = 0, findings = 0, warnings = 0;
     const auto check = [&](const std::string& name, const CUlfItemDialog& dialog) {
         if (!o.item.empty() && name != o.item) return;
         ++items;
         for (const T_FINDING& f : dialog.Findings()) {
             std::printf("%s: %s: %s\n", name.c_str(), f.field.c_str(), f.text.c_str());
             ++findings;
+        }
+        for (const T_FINDING& f : dialog.Warnings()) {
+            std::printf("%s: %s: %s\n", name.c_str(), f.field.c_str(),
+                        Say("IDS_QM_CLI_ULF_WARNING", f.text).c_str());
+            ++warnings;
         }
     };
     for (const auto& [key, item] : doc.Data().Model().ulfItems)
@@ -193,6 +211,8 @@ EXIT_CODE RunUlfCheck(const T_ULF_OPTIONS& o)
     std::printf(
         "%s\n",
         Say("IDS_QM_CLI_ULF_FINDINGS", std::to_string(items), std::to_string(findings)).c_str());
+    if (warnings > 0)
+        std::printf("%s\n", Say("IDS_QM_CLI_ULF_WARNINGS", std::to_string(warnings)).c_str());
     return findings == 0 ? EXIT_CODE::Done : EXIT_CODE::NotFound;
 }
 
@@ -213,8 +233,11 @@ EXIT_CODE RunUlfSolve(const T_ULF_OPTIONS& o)
     if (in.stage && !o.shapePlot.empty())
         return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_SHAPE_PLOT_STATIC", o.item));
     if (const EXIT_CODE code = AnalyseForUlf(o.file, in); code != EXIT_CODE::Done) return code;
+    in.dialog->m_dump = o.dump;
     const T_ULF_OUTCOME outcome = SolveUlf(*in.dialog);
     const auto& result = in.dialog->Result();
+    for (const T_FINDING& f : result ? in.dialog->Warnings() : std::vector<T_FINDING>())
+        Complain(EXIT_CODE::Done, ItemOf(o) + ": " + Say("IDS_QM_CLI_ULF_WARNING", f.text));
     if (outcome.code != EXIT_CODE::Done) Complain(outcome.code, ItemOf(o) + ": " + outcome.message);
     if (!o.json.empty()) {
         const EXIT_CODE code = WriteOutput(o.json, UlfJson(outcome, result));
@@ -264,6 +287,7 @@ EXIT_CODE RunUlfExport(const T_ULF_OPTIONS& o)
     if (const EXIT_CODE code = OpenAndAnalyse(o, in); code != EXIT_CODE::Done) return code;
     if (const EXIT_CODE code = SolveOpened(o, in); code != EXIT_CODE::Done) return code;
     CUnknownLoadFactorResultDlg dialog(in.doc, *in.dialog->Result());
+    dialog.m_force = o.force;
     if (!dialog.OnExport(o.out, settings)) {
         const bool fits = UlfSheetFits(dialog.Result().constraints.size(), o.sheetVersion);
         return LastMessage(dialog, fits ? EXIT_CODE::NoAccess : EXIT_CODE::BadInput, o.file);
@@ -272,6 +296,8 @@ EXIT_CODE RunUlfExport(const T_ULF_OPTIONS& o)
                             std::to_string(dialog.Result().constraints.size()),
                             std::to_string(dialog.Result().cases.size()))
                             .c_str());
+    if (o.open && !OpenSheetFile(o.out))
+        return Complain(EXIT_CODE::NoAccess, o.out + ": " + Say("IDS_QM_ULF_NO_EXCEL"));
     return EXIT_CODE::Done;
 }
 
@@ -290,6 +316,7 @@ EXIT_CODE RunUlfCombine(const T_ULF_OPTIONS& o)
     if (const EXIT_CODE code = AnalyseForUlf(o.file, in); code != EXIT_CODE::Done) return code;
     if (const EXIT_CODE code = SolveOpened(o, in); code != EXIT_CODE::Done) return code;
     CUnknownLoadFactorResultDlg dialog(in.doc, *in.dialog->Result());
+    dialog.m_force = o.force;
     dialog.m_combinationName = o.name;
     (void)TakeMessageHistory(); // what the calculation has left
     const int made = dialog.OnMakeCombination();

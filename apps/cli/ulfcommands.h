@@ -16,6 +16,9 @@ struct T_ULF_OPTIONS {
     std::string date;           // in the spreadsheet, YYYY-MM-DD; empty: today
     int sheetVersion = 16;      // of the spreadsheet program
     bool overwrite = false;     // files that are there
+    bool dump = false;          // write the problem of the solver beside the file
+    bool open = false;          // start the spreadsheet program on the sheet
+    bool force = false;         // write factors that miss constraints
     bool sumStageLoads = false; // load groups 0 and 1 of a stage item read the sum of all
 };
 
@@ -30,8 +33,9 @@ EXIT_CODE RunUlfSolve(const T_ULF_OPTIONS& options);
 /// What holds the solution and what relaxing it buys; or which constraints contradict each other,
 /// and the compromise that misses them least. NotFound: there is no solution.
 EXIT_CODE RunUlfExplain(const T_ULF_OPTIONS& options);
-/// Solves and writes the spreadsheet with the influence matrix.
+/// Solves and writes the spreadsheet with the influence matrix. NotFound: also for factors that
+/// miss constraints, which only `force` writes.
 EXIT_CODE RunUlfExport(const T_ULF_OPTIONS& options);
-/// Solves and adds the load combination with the factors. Usage: also for an item of construction
-/// stages, since there are no combinations of loads at stages.
+/// Solves and adds the load combination with the factors. NotFound: likewise. Usage: also for an
+/// item of construction stages, since there are no combinations of loads at stages.
 EXIT_CODE RunUlfCombine(const T_ULF_OPTIONS& options);

@@ -15,10 +15,13 @@ using zql::lib::MMSGFunction;
 
 namespace {
 
-/// Codes of the solver that say that there is no solution; others refuse the input.
+constexpr int kNotCertified = 10;
+
+/// Codes of the solver that say that there is no solution, or that none was proved; others refuse
+/// the input.
 bool SaysNoSolution(int code)
 {
-    return code >= 5 && code <= 8;
+    return (code >= 5 && code <= 8) || code == kNotCertified;
 }
 
 std::string OneLine(std::string text)
@@ -41,6 +44,49 @@ int Widest(const ROWS& rows, int least, const F& text)
     return static_cast<int>(width);
 }
 
+/// Names of the load cases, each with its factor; ones of the unknowns that are rounding as 0.
+std::string FactorTable(const T_ULF_RESULT& r)
+{
+    const std::string head = Say(r.stage ? "IDS_QM_CLI_STAGE_CASE" : "IDS_QM_CLI_LOAD_CASE");
+    const int width = Widest(r.cases, std::max(10, static_cast<int>(head.size())),
+                             [](const T_ULF_CASE& c) { return c.name; });
+    std::string text =
+        FormatText("%-*s %9s %16s\n", width, head.c_str(), "", Say("IDS_QM_CLI_FACTOR").c_str());
+    for (std::size_t i = 0; i < r.cases.size(); ++i)
+        text +=
+            FormatText("%-*s %9s %16.9g\n", width, r.cases[i].name.c_str(),
+                       Say(r.cases[i].unknown ? "IDS_QM_CLI_UNKNOWN" : "IDS_QM_CLI_KNOWN").c_str(),
+                       UlfShownFactor(r, i));
+    return text;
+}
+
+/// The constraints in their units. What the values are is said where they are a forecast.
+std::string ConstraintTable(const T_ULF_RESULT& r)
+{
+    const auto rows = UlfResultRows(r);
+    const auto nameOf = [](const T_ULF_RESULT_ROW& row) { return UlfNameAt(row.name, row.place); };
+    const int width = Widest(rows, 10, nameOf);
+    const int unitWidth = Widest(rows, 4, [](const T_ULF_RESULT_ROW& row) { return row.unit; });
+    std::string text = FormatText(
+        "%-*s %15s %15s %15s %13s %-*s  %s\n", width, Say("IDS_QM_CLI_CONSTRAINT").c_str(),
+        Say(r.linearForecast ? "IDS_QM_CLI_FORECAST" : "IDS_QM_CLI_VALUE").c_str(),
+        Say("IDS_QM_CLI_LOWER").c_str(), Say("IDS_QM_CLI_UPPER").c_str(),
+        Say("IDS_QM_CLI_MISSED_BY").c_str(), unitWidth, Say("IDS_QM_CLI_UNIT").c_str(),
+        Say("IDS_QM_CLI_STATE").c_str());
+    for (std::size_t i = 0; i < rows.size(); ++i) {
+        const T_ULF_RESULT_ROW& row = rows[i];
+        const double scale = UlfScale(r, i);
+        const std::string state = !row.met     ? Say("IDS_QM_CLI_NOT_MET")
+                                  : row.active ? Say("IDS_QM_CLI_ACTIVE")
+                                               : "-";
+        text += FormatText("%-*s %15.7g %15s %15s %13.3g %-*s  %s\n", width, nameOf(row).c_str(),
+                           UlfShown(row.value, scale), Short(row.lower).c_str(),
+                           Short(row.upper).c_str(), UlfShown(row.residual, scale), unitWidth,
+                           row.unit.c_str(), state.c_str());
+    }
+    return text;
+}
+
 } // namespace
 
 EXIT_CODE OpenUlfItem(const std::string& file, const std::string& item, bool sumStageLoads,
@@ -54,7 +100,7 @@ EXIT_CODE OpenUlfItem(const std::string& file, const std::string& item, bool sum
         return Complain(EXIT_CODE::BadInput, file + ": " + Say("IDS_QM_CLI_ULF_TWO_ITEMS", item));
     if (out.stage) {
         auto dialog = std::make_unique<CUnknownStageItemDlg>(out.doc, stageKey);
-        dialog->m_sumStageLoads = sumStageLoads;
+        dialog->m_sumStageLoads |= sumStageLoads;
         out.dialog = std::move(dialog);
     } else if (isStatic) {
         auto dialog = std::make_unique<CUnknownLoadFactorItemDlg>(out.doc, key);
@@ -105,38 +151,15 @@ T_ULF_OUTCOME SolveUlf(CUlfItemDialog& dialog)
     const bool none = run && (SaysNoSolution(out.solverCode) || run->answer.constraint > 0 ||
                               run->answer.factor > 0);
     out.status = none ? "not found" : "refused";
+    if (none && out.solverCode == kNotCertified) out.status = "not proved";
     out.code = none ? EXIT_CODE::NotFound : EXIT_CODE::BadInput;
     return out;
 }
 
 std::string UlfTables(const T_ULF_RESULT& r)
 {
-    const std::string head = Say(r.stage ? "IDS_QM_CLI_STAGE_CASE" : "IDS_QM_CLI_LOAD_CASE");
-    const int caseWidth = Widest(r.cases, std::max(10, static_cast<int>(head.size())),
-                                 [](const T_ULF_CASE& c) { return c.name; });
-    std::string text = FormatText("%-*s %9s %16s\n", caseWidth, head.c_str(), "",
-                                  Say("IDS_QM_CLI_FACTOR").c_str());
-    for (std::size_t i = 0; i < r.cases.size(); ++i)
-        text +=
-            FormatText("%-*s %9s %16.9g\n", caseWidth, r.cases[i].name.c_str(),
-                       Say(r.cases[i].unknown ? "IDS_QM_CLI_UNKNOWN" : "IDS_QM_CLI_KNOWN").c_str(),
-                       r.factors[i] + 0.0);
-    const auto rows = UlfResultRows(r);
-    const auto nameOf = [](const T_ULF_RESULT_ROW& row) { return UlfNameAt(row.name, row.place); };
-    const int width = Widest(rows, 10, nameOf);
-    text += FormatText("\n%-*s %15s %15s %15s %13s  %s\n", width,
-                       Say("IDS_QM_CLI_CONSTRAINT").c_str(), Say("IDS_QM_CLI_VALUE").c_str(),
-                       Say("IDS_QM_CLI_LOWER").c_str(), Say("IDS_QM_CLI_UPPER").c_str(),
-                       Say("IDS_QM_CLI_MISSED_BY").c_str(), Say("IDS_QM_CLI_STATE").c_str());
-    for (std::size_t i = 0; i < rows.size(); ++i) {
-        const T_ULF_RESULT_ROW& row = rows[i];
-        const double scale = UlfScale(r, i);
-        const std::string state = !row.met     ? Say("IDS_QM_CLI_NOT_MET")
-                                  : row.active ? Say("IDS_QM_CLI_ACTIVE")
-                                               : "-";
-        text += FormatText("%-*s %15.7g %15s %15s %13.3g  %s\n", width, nameOf(row).c_str(),
-                           UlfShown(row.value, scale), Short(row.lower).c_str(),
-                           Short(row.upper).c_str(), UlfShown(row.residual, scale), state.c_str());
-    }
-    return text + "\n" + Say("IDS_QM_CLI_OBJECTIVE", FormatText("%.9g", UlfObjective(r))) + "\n";
+    std::string text = FactorTable(r) + "\n" + ConstraintTable(r) + "\n" +
+                       Say("IDS_QM_CLI_OBJECTIVE", FormatText("%.9g", UlfObjective(r))) + "\n";
+    if (r.linearForecast) text += Say("IDS_QM_ULF_LINEAR_FORECAST") + "\n";
+    return text;
 }

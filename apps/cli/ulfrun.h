@@ -11,7 +11,7 @@
 /// What a run gave.
 struct T_ULF_OUTCOME {
     EXIT_CODE code = EXIT_CODE::Done; // NotFound: no solution, or a constraint is not met
-    std::string status;               // "found", "not met", "not found", "refused"
+    std::string status;               // "found", "not met", "not found", "not proved", "refused"
     std::string message;              // one line
     int solverCode = 0;
     bool exact = false;

@@ -10,6 +10,9 @@
 #include <cerrno>
 #include <cmath>
 #include <filesystem>
+#include <spawn.h>
+#include <sys/wait.h>
+#include <unistd.h>
 
 namespace fs = std::filesystem;
 
@@ -140,4 +143,14 @@ int WriteSheet(const std::string& path, const T_SHEET& sheet, T_FILE_ERROR& erro
     });
     if (isTried && bytes.empty()) error = std::move(refusal);
     return bytes.empty() ? 0 : CFileCtrl::WriteWholeFile(path, bytes, error);
+}
+
+int OpenSheetFile(const std::string& path)
+{
+    std::string program = "xdg-open", file = path;
+    char* const arguments[] = {program.data(), file.data(), nullptr};
+    pid_t child = 0;
+    if (posix_spawnp(&child, program.c_str(), nullptr, nullptr, arguments, environ) != 0) return 0;
+    int status = 0; // it starts the program and ends
+    return waitpid(child, &status, 0) == child && WIFEXITED(status) && WEXITSTATUS(status) == 0;
 }

@@ -79,3 +79,7 @@ void EdgeRight(T_SHEET& sheet, const T_SHEET_BLOCK& block, SHEET_EDGE edge);
 /// cell beyond the sheet, a text of more than 32,767 or a formula of more than 8,192 letters, a
 /// wrong name; NoAccess for a file that can't be written or that an office program has open.
 [[nodiscard]] int WriteSheet(const std::string& path, const T_SHEET& sheet, T_FILE_ERROR& error);
+
+/// Opens a file in the program that the desktop has for its kind (xdg-open), which stays open on
+/// its own. 1 started; 0 there is no such program.
+[[nodiscard]] int OpenSheetFile(const std::string& path);

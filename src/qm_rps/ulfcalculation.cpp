@@ -5,6 +5,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_rps/factors/ulfstageplace.h"
 #include "qm_rps/factors/ulfstageproblem.h"
+#include "qm_rps/factors/ulftexts.h"
 #include "qm_rps/optdsgn.h"
 
 using zql::lib::MMSGFunction;
@@ -29,7 +30,9 @@ void ReadConstraints(CDBDoc& doc, T_ULF_RUN& run)
 {
     for (const std::string& name : run.item.constraints) {
         T_ULFC_D constraint;
-        if (doc.Attr().GetUlfc_(name, constraint)) run.constraints.push_back(std::move(constraint));
+        if (!doc.Attr().GetUlfc_(name, constraint)) continue;
+        run.units.push_back(UlfUnitText(constraint.type, constraint.component, doc.Unit().Units()));
+        run.constraints.push_back(std::move(constraint));
     }
 }
 
@@ -49,9 +52,7 @@ std::string FailureText(const T_ULF_RUN& run, const std::string& sourceError)
 /// The constraints that equations could not meet, if any.
 std::optional<T_FINDING> MissesOf(const T_ULF_RESULT& result)
 {
-    std::string names;
-    for (const T_ULF_RESULT_ROW& row : UlfResultRows(result))
-        if (!row.met) names += (names.empty() ? "" : ", ") + UlfNameAt(row.name, row.place);
+    const std::string names = UlfMisses(result);
     if (names.empty()) return std::nullopt;
     constexpr const char* key = "IDS_QM_ULF_NOT_MET";
     return Saying(key, MMSGFunction::Format(key, {names}));
@@ -100,7 +101,8 @@ T_ULF_CALCULATION CalculateUlf(CDBDoc& doc, const T_ULFI_D& item,
     return Finished(std::move(run), read && found, source.Error());
 }
 
-T_ULF_CALCULATION CalculateUlfStages(CDBDoc& doc, const T_ULSI_D& item, CUlfStageResponse& source)
+T_ULF_CALCULATION CalculateUlfStages(CDBDoc& doc, const T_ULSI_D& item, CUlfStageResponse& source,
+                                     const T_OPT_DUMP& dump)
 {
     T_ULF_RUN run;
     run.item = {item.name,       0, item.objective, item.sign, item.solveByEquations, {},
@@ -111,10 +113,14 @@ T_ULF_CALCULATION CalculateUlfStages(CDBDoc& doc, const T_ULSI_D& item, CUlfStag
     ReadConstraints(doc, run);
     for (const T_ULFC_D& c : run.constraints)
         run.places.push_back(UlfPlaceText(doc.Data(), c.stage, c.step));
+    const T_STCT_D& control = doc.Data().Model().styp.stageControl;
+    run.linearForecast = control.geometricStiffness || control.cableSag;
     T_ULF_STAGE_FORMED formed = FormUlfStageProblem(item, run.constraints);
     source.m_loads = formed.loads;
+    source.m_sumStageLoads = item.sumStageLoads;
     run.formed = std::move(formed);
     COptDsgn optimizer(source, &source);
+    optimizer.m_dump = dump;
     const bool found = optimizer.Run(run.formed.problem, run.answer) != 0;
     const bool read = ReadUlfStageInfluence(item, run.formed, source, run.influence) != 0;
     return Finished(std::move(run), read && found, source.Error());

@@ -14,4 +14,5 @@ T_ULF_CALCULATION CalculateUlf(CDBDoc& doc, const T_ULFI_D& item,
 
 /// Of an item of construction stages that keeps its rules. The cases of the result are its rows,
 /// "S1/First Step T". Either outcome goes to the message history.
-T_ULF_CALCULATION CalculateUlfStages(CDBDoc& doc, const T_ULSI_D& item, CUlfStageResponse& source);
+T_ULF_CALCULATION CalculateUlfStages(CDBDoc& doc, const T_ULSI_D& item, CUlfStageResponse& source,
+                                     const T_OPT_DUMP& dump = {});

@@ -12,15 +12,20 @@ void CUlfItemDialog::SetChecks(const std::vector<std::string>& names, bool items
     const T_MODEL& model = m_doc.Data().Model();
     m_checks.clear();
     m_missing.clear();
+    const auto times = [&](const std::string& name) {
+        return static_cast<int>(std::ranges::count(names, name));
+    };
     for (const std::string& name : names) {
+        const bool isThere = std::ranges::find(m_checks, name, &T_CHECK::name) != m_checks.end();
         if (FindUlfConstraint(model, name) == 0)
             m_missing.push_back(name);
-        else if (itemsFirst)
-            m_checks.push_back({name, true});
+        else if (itemsFirst && !isThere)
+            m_checks.push_back({name, true, times(name)});
     }
     for (const auto& [key, constraint] : model.ulfConstraints) {
-        const bool checked = std::ranges::find(names, constraint.name) != names.end();
-        if (!checked || !itemsFirst) m_checks.push_back({constraint.name, checked});
+        const int count = times(constraint.name);
+        if (count == 0 || !itemsFirst)
+            m_checks.push_back({constraint.name, count > 0, std::max(count, 1)});
     }
 }
 
@@ -28,7 +33,8 @@ std::vector<std::string> CUlfItemDialog::CheckedNames() const
 {
     std::vector<std::string> names;
     for (const T_CHECK& check : m_checks)
-        if (check.checked) names.push_back(check.name);
+        if (check.checked)
+            names.insert(names.end(), static_cast<std::size_t>(check.times), check.name);
     names.insert(names.end(), m_missing.begin(), m_missing.end());
     return names;
 }
@@ -39,6 +45,11 @@ std::string CUlfItemDialog::CheckText(std::size_t check) const
     return check < m_checks.size() && m_doc.Attr().GetUlfc_(m_checks[check].name, constraint)
                ? UlfConstraintText(m_doc.Data(), constraint)
                : std::string();
+}
+
+T_OPT_DUMP CUlfItemDialog::Dump()
+{
+    return {m_dump, m_doc.Path(), [this] { return AskYesNo("IDS_QM_ULF_DUMP_EXISTS"); }};
 }
 
 int CUlfItemDialog::OnAnalyse(const ULF_PROGRESS& progress, std::string& error)

@@ -17,6 +17,7 @@ public:
     struct T_CHECK {
         std::string name; // of a constraint of the model
         bool checked = false;
+        int times = 1; // that the item names it; another choice of the person makes it 1
         bool operator==(const T_CHECK&) const = default;
     };
 
@@ -51,6 +52,11 @@ public:
     const T_ULF_CALCULATION& Calculation() const { return m_calculation; }
     const std::optional<T_ULF_RESULT>& Result() const { return m_calculation.result; }
 
+    bool m_dump = false; // debug: write the problem handed to the solver beside the model file
+
+    /// What a calculation does not refuse and a person should know; of no static item.
+    virtual std::vector<T_FINDING> Warnings() const { return {}; }
+
 protected:
     CDBDoc& m_doc;
 
@@ -58,6 +64,10 @@ protected:
     virtual T_ULF_CALCULATION Calculated() = 0;
     /// What to analyse for a calculation; empty: the document has current results of it all.
     virtual std::optional<T_ANALYSIS_OPTIONS> MissingResults() const = 0;
+
+    /// The dump of a calculation; a file that is there is overwritten or extended as the person
+    /// says.
+    T_OPT_DUMP Dump();
 
     /// Flags of the grids: "1" and "0".
     static std::string Flag(bool on) { return on ? "1" : "0"; }

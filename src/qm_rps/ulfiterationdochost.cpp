@@ -10,6 +10,27 @@
 
 using zql::lib::MMSGFunction;
 
+CUlfIterationDocHost::CUlfIterationDocHost(CDBDoc& doc, T_ULSI_D item)
+    : m_doc(doc), m_item(std::move(item)), m_start(PretensionOf(m_item, doc.Data()))
+{
+}
+
+std::vector<T_ULF_ANALYSED> CUlfIterationDocHost::Analysed(double tolerance)
+{
+    CUlfStageResults results(m_doc);
+    std::vector<T_ULF_ANALYSED> all;
+    if (m_result &&
+        !CompareWithAnalysis(*m_run, *m_result, m_item, m_doc.Data(), results, tolerance, all))
+        all.clear();
+    return all;
+}
+
+std::vector<T_ULF_STAY> CUlfIterationDocHost::Stays()
+{
+    CUlfStageResults results(m_doc);
+    return StaysOf(m_start, m_doc.Data(), results);
+}
+
 int CUlfIterationDocHost::Refuse(const std::string& text)
 {
     m_error = text;
@@ -32,7 +53,6 @@ int CUlfIterationDocHost::Solve(std::vector<T_ULF_ITER_ROW>& rows, std::optional
 {
     CUlfStageResults results(m_doc);
     CUlfStageResponse source(results);
-    source.m_sumStageLoads = m_sumStageLoads;
     T_ULF_CALCULATION calculation = CalculateUlfStages(m_doc, m_item, source);
     said = calculation.said;
     m_unknowns = calculation.run->formed.unknowns;
@@ -42,6 +62,7 @@ int CUlfIterationDocHost::Solve(std::vector<T_ULF_ITER_ROW>& rows, std::optional
     }
     rows = RowsOf(*calculation.run);
     m_result = std::move(calculation.result);
+    m_run = std::move(calculation.run);
     return 1;
 }
 

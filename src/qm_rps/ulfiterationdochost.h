@@ -1,16 +1,14 @@
 // The iterative analysis on a document and its construction-stage item.
 #pragma once
 
+#include "qm_rps/factors/ulfanalysed.h"
 #include "qm_rps/factors/ulfiterationhost.h"
 #include "qm_rps/ulfcalculation.h"
 
 class CUlfIterationDocHost : public IUlfIterationHost {
 public:
     /// An item that keeps its rules. The document must outlive the host.
-    CUlfIterationDocHost(CDBDoc& doc, T_ULSI_D item, bool sumStageLoads)
-        : m_doc(doc), m_item(std::move(item)), m_sumStageLoads(sumStageLoads)
-    {
-    }
+    CUlfIterationDocHost(CDBDoc& doc, T_ULSI_D item);
 
     std::string ModelPath() const override { return m_doc.Path(); }
     [[nodiscard]] int Solve(std::vector<T_ULF_ITER_ROW>& rows,
@@ -39,6 +37,11 @@ public:
     const std::string& Error() const { return m_error; }
     /// Of the latest solution.
     const std::optional<T_ULF_RESULT>& Result() const { return m_result; }
+    /// The constraints of the latest solution in the structure that it was solved from, see
+    /// CompareWithAnalysis; empty before a solution, or where they can't be read.
+    std::vector<T_ULF_ANALYSED> Analysed(double tolerance);
+    /// Every element whose pretension is scaled, since this host began.
+    std::vector<T_ULF_STAY> Stays();
 
 private:
     std::vector<T_ULF_ITER_ROW> RowsOf(const T_ULF_RUN& run) const;
@@ -48,8 +51,9 @@ private:
 
     CDBDoc& m_doc;
     T_ULSI_D m_item;
-    bool m_sumStageLoads;
     std::vector<std::size_t> m_unknowns; // rows of the item, of the latest problem
+    ULF_PRETENSION m_start;              // before the first iteration
+    std::optional<T_ULF_RUN> m_run;      // of the latest solution
     std::optional<T_ULF_RESULT> m_result;
     std::string m_error;
     bool m_isSaveRefused = false;

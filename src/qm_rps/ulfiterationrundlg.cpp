@@ -32,11 +32,16 @@ constexpr T_END_KEY kEnds[] = {
     {ULF_ITER_END::NotAnalysed, "IDS_QM_UI_ULF_NOT_ANALYSED"},
 };
 
-std::string EndText(ULF_ITER_END end, const std::string& reason)
+std::string TextOf(ULF_ITER_END end, const std::string& reason)
 {
     const auto* it = std::ranges::find(kEnds, end, &T_END_KEY::end);
     const std::string text = MMSGFunction::GetValue(it->key);
     return reason.empty() ? text : text + "\n" + reason;
+}
+
+std::string NumberText(const std::optional<double>& value)
+{
+    return value ? FormatText("%.7g", *value + 0.0) : std::string();
 }
 
 std::string RunningText(int iterations, int required)
@@ -107,6 +112,8 @@ void CUlfIterationRunDlg::Clear()
 {
     m_history.clear();
     m_result.reset();
+    m_analysed.clear();
+    m_stays.clear();
     m_status.clear();
     m_step = -1;
 }
@@ -171,8 +178,8 @@ int CUlfIterationRunDlg::Analyse()
     T_ANALYSIS_ERROR error;
     if (RunWatchedAnalysis(m_doc, options, goesOn, error)) return 1;
     const bool cancelled = error.fault == ANALYSIS_FAULT::Cancelled;
-    return Fail(EndText(cancelled ? ULF_ITER_END::Cancelled : ULF_ITER_END::NotAnalysed,
-                        cancelled ? std::string() : error.text));
+    return Fail(TextOf(cancelled ? ULF_ITER_END::Cancelled : ULF_ITER_END::NotAnalysed,
+                       cancelled ? std::string() : error.text));
 }
 
 int CUlfIterationRunDlg::OnRun()
@@ -208,6 +215,12 @@ bool CUlfIterationRunDlg::MayOverwrite(const std::string& report)
     return AskYesNo(key, MMSGFunction::Format(key, {report}));
 }
 
+bool CUlfIterationRunDlg::MayReplace(const std::string& copy)
+{
+    constexpr const char* key = "IDS_QM_ULF_COPY_EXISTS";
+    return AskYesNo(key, MMSGFunction::Format(key, {copy}));
+}
+
 bool CUlfIterationRunDlg::GoesOn(int done, int required)
 {
     std::string status = RunningText(done, required);
@@ -225,16 +238,73 @@ int CUlfIterationRunDlg::Start()
     if (!findings.empty()) return Fail(findings.front().text);
     if (!Analyse()) return 0;
 
-    CUlfIterationDocHost host(m_doc, item.record, item.sumStageLoads);
+    CUlfIterationDocHost host(m_doc, item.record);
     CUlfIteration run(host, *this, Settings());
     const int done = run.Run();
     m_result = host.Result();
+    if (run.History().size() > 1) { // something was applied
+        m_analysed = host.Analysed(Settings().tolerance);
+        m_stays = host.Stays();
+    }
     const ULF_ITER_END end = run.End();
     if (end == ULF_ITER_END::NotSolved || end == ULF_ITER_END::ReportNotWritten)
         ShowMessage(run.Said()->messageKey, run.Said()->text);
-    const bool plain = end == ULF_ITER_END::Required && Settings().required == 0;
-    Tell(plain ? MMSGFunction::GetValue("IDS_QM_UI_ULF_SOLVED") : EndText(end, host.Error()));
+    const bool isKept = end == ULF_ITER_END::NotSaved && host.Error().empty() && run.Said();
+    Tell(EndText(run, isKept ? run.Said()->text : host.Error()));
     return done;
+}
+
+std::string CUlfIterationRunDlg::EndText(const CUlfIteration& run, const std::string& reason) const
+{
+    if (run.End() == ULF_ITER_END::Required && Settings().required == 0)
+        return MMSGFunction::GetValue("IDS_QM_UI_ULF_SOLVED");
+    std::string names;
+    for (const T_ULF_ANALYSED& a : m_analysed)
+        if (!a.Agrees()) names += (names.empty() ? "" : ", ") + UlfNameAt(a.name, a.place);
+    return run.End() == ULF_ITER_END::Converged && !names.empty()
+               ? MMSGFunction::Format("IDS_QM_UI_ULF_DIFFERS", {names})
+               : TextOf(run.End(), reason);
+}
+
+std::string CUlfIterationRunDlg::AnalysedText(std::size_t row, std::size_t column) const
+{
+    const T_ULF_ANALYSED& a = m_analysed.at(row);
+    switch (column) {
+    case 0:
+        return UlfNameAt(a.name, a.place);
+    case 1:
+        return NumberText(a.Shown(a.forecast));
+    case 2:
+        return NumberText(a.Shown(a.analysed));
+    case 3:
+        return NumberText(a.Shown(a.analysed - a.forecast));
+    default:
+        return a.unit;
+    }
+}
+
+std::string CUlfIterationRunDlg::StayText(std::size_t row, std::size_t column) const
+{
+    const T_ULF_STAY& s = m_stays.at(row);
+    switch (column) {
+    case 0:
+        return std::to_string(s.element);
+    case 1:
+        return s.load;
+    case 2:
+        return NumberText(s.start);
+    case 3:
+        return NumberText(s.Factor());
+    case 4:
+        return NumberText(s.now);
+    default:
+        return NumberText(s.force);
+    }
+}
+
+std::string CUlfIterationRunDlg::ForceUnit() const
+{
+    return std::string(NameOf(m_doc.Data().Units().force));
 }
 
 std::string CUlfIterationRunDlg::StepText(std::size_t row, std::size_t column) const

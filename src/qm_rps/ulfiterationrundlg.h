@@ -3,7 +3,8 @@
 #pragma once
 
 #include "qm_db/dbdoc.h"
-#include "qm_rps/factors/ulfresult.h"
+#include "qm_rps/factors/ulfanalysed.h"
+#include "qm_rps/factors/ulfiteration.h"
 #include "qm_rps/ulfiterationresultdlg.h"
 #include "qm_rps/unknownloadfactoriteranal.h"
 
@@ -11,7 +12,6 @@
 struct T_ULF_ITER_ITEM {
     int key = 0; // in the model; 0: it is not stored
     T_ULSI_D record;
-    bool sumStageLoads = false;
 };
 
 class CUlfIterationRunDlg : public zql::frx::MDialog, private IUlfIterationPerson {
@@ -23,6 +23,14 @@ public:
     static constexpr std::array<const char*, 5> kRowHeads{
         "IDS_RPS_GXGRID_Stage", "IDS_RPS_GXGRID_LCase", "IDS_RPS_GXGRID_Factor",
         "IDS_QM_ULSI_HEAD_PRETENSION", "IDS_QM_UI_ULF_APPLIED"};
+
+    /// Columns of the constraints in the analysed structure, and of the scaled elements.
+    static constexpr std::array<const char*, 5> kAnalysedHeads{
+        "IDS_RPS_UNKNOWN_LOAD_GXRESULT_Constraint", "IDS_QM_CLI_FORECAST", "IDS_QM_CLI_ANALYSED",
+        "IDS_QM_CLI_DIFFERENCE", "IDS_QM_UI_ULF_UNIT"};
+    static constexpr std::array<const char*, 6> kStayHeads{
+        "IDS_QM_UI_ULF_ELEMENT", "IDS_RPS_GXGRID_LCase", "IDS_QM_CLI_STAY_START",
+        "IDS_RPS_GXGRID_Factor", "IDS_QM_CLI_STAY_NOW",  "IDS_QM_CLI_STAY_FORCE"};
 
     /// On the stored items of the model, of which one is chosen (0: the first).
     explicit CUlfIterationRunDlg(CDBDoc& doc, int item = 0);
@@ -56,6 +64,12 @@ public:
     int m_step = -1; // chosen row of the table of iterations; the last one comes with each solution
     std::size_t Rows() const; // of the chosen iteration
     std::string RowText(std::size_t row, std::size_t column) const;
+    /// Of the last copy, once an iteration has been made.
+    const std::vector<T_ULF_ANALYSED>& Analysed() const { return m_analysed; }
+    const std::vector<T_ULF_STAY>& Stays() const { return m_stays; }
+    std::string AnalysedText(std::size_t row, std::size_t column) const;
+    std::string StayText(std::size_t row, std::size_t column) const;
+    std::string ForceUnit() const;
     /// Shows the window of the latest solution's result. 0: there is none.
     [[nodiscard]] int OnShowResult();
 
@@ -63,12 +77,14 @@ private:
     void Solved(const T_ULF_ITER_STEP& step, const std::optional<T_FINDING>& said) override;
     ULF_ITER_WISH Wish(const T_ULF_ITER_STEP& step) override;
     bool MayOverwrite(const std::string& report) override;
+    bool MayReplace(const std::string& copy) override;
     bool GoesOn(int done, int required) override;
 
     std::vector<int> ItemKeys() const;
     T_ULF_ITER_ITEM Item() const;
     void Clear();
     [[nodiscard]] int Start();
+    std::string EndText(const CUlfIteration& run, const std::string& reason) const;
     [[nodiscard]] int Analyse();
     void Tell(std::string status);
     int Fail(const std::string& text);
@@ -79,5 +95,7 @@ private:
     bool m_running = false, m_cancel = false;
     std::vector<T_ULF_ITER_STEP> m_history;
     std::optional<T_ULF_RESULT> m_result; // of the latest solution
+    std::vector<T_ULF_ANALYSED> m_analysed;
+    std::vector<T_ULF_STAY> m_stays;
     std::string m_status;
 };

@@ -150,7 +150,5 @@ void CUnknownLoadFactorItemDlg::OnSelChangeCombinationIndex(int index)
 
 T_ULF_CALCULATION CUnknownLoadFactorItemDlg::Calculated()
 {
-    return CalculateUlf(
-        m_doc, Record(), m_cases, m_cache,
-        {m_dump, m_doc.Path(), [this] { return AskYesNo("IDS_QM_ULF_DUMP_EXISTS"); }});
+    return CalculateUlf(m_doc, Record(), m_cases, m_cache, Dump());
 }

@@ -44,8 +44,6 @@ public:
     int OnOK() override;
     int Key() const { return m_key; }
 
-    bool m_dump = false; // debug: write the problem handed to the solver beside the model file
-
 private:
     T_ULF_CALCULATION Calculated() override;
     std::optional<T_ANALYSIS_OPTIONS> MissingResults() const override;

@@ -5,7 +5,6 @@
 #include "qm_base/textformat.h"
 #include "qm_rps/factors/checks/ulfcombinationchecks.h"
 #include "qm_rps/factors/ulfcombination.h"
-#include "qm_rps/factors/ulftexts.h"
 
 #include <filesystem>
 
@@ -47,9 +46,13 @@ CUnknownLoadFactorResultDlg::STATE CUnknownLoadFactorResultDlg::StateOf(std::siz
 
 std::string CUnknownLoadFactorResultDlg::UnitOf(std::size_t i) const
 {
-    T_ULFC_D c;
-    if (!m_doc.Attr().GetUlfc_(RowAt(i).name, c)) return {};
-    return UlfUnitText(c.type, c.component, m_doc.Unit().Units());
+    return RowAt(i).unit;
+}
+
+std::string CUnknownLoadFactorResultDlg::Notice() const
+{
+    return m_result.linearForecast ? MMSGFunction::GetValue("IDS_QM_ULF_LINEAR_FORECAST")
+                                   : std::string();
 }
 
 std::string CUnknownLoadFactorResultDlg::ModelTitle() const
@@ -61,7 +64,7 @@ std::string CUnknownLoadFactorResultDlg::FactorText(std::size_t row, std::size_t
 {
     const T_ULF_CASE& c = m_result.cases.at(row);
     if (column == 0) return c.name;
-    if (column == 1) return NumberText(m_result.factors.at(row));
+    if (column == 1) return NumberText(UlfShownFactor(m_result, row));
     return MMSGFunction::GetValue(c.unknown ? "IDS_RPS_GXGRID_Unknown" : "IDS_RPS_GXGRID_known");
 }
 
@@ -89,6 +92,13 @@ std::string CUnknownLoadFactorResultDlg::ConstraintText(std::size_t i, std::size
     }
 }
 
+bool CUnknownLoadFactorResultDlg::MayWrite()
+{
+    constexpr const char* key = "IDS_QM_ULF_MISSES";
+    const std::string misses = UlfMisses(m_result);
+    return m_force || misses.empty() || AskYesNo(key, MMSGFunction::Format(key, {misses}));
+}
+
 int CUnknownLoadFactorResultDlg::OnExport(const std::string& path,
                                           const T_ULF_SHEET_SETTINGS& settings)
 {
@@ -97,9 +107,18 @@ int CUnknownLoadFactorResultDlg::OnExport(const std::string& path,
         ShowMessage("IDS_RPS_UNKNOWN_LOAD_EXCEED_COLUMN_ERROR");
         return 0;
     }
+    if (!MayWrite()) return 0;
     T_FILE_ERROR error;
     if (WriteSheet(path, sheet, error)) return 1;
     ShowMessage("IDS_QM_ULF_SHEET_NOT_WRITTEN", error.text);
+    return 0;
+}
+
+int CUnknownLoadFactorResultDlg::OnOpenSheet(const std::string& path)
+{
+    if (!OnExport(path)) return 0;
+    if (OpenSheetFile(path)) return 1;
+    ShowMessage("IDS_QM_ULF_NO_EXCEL");
     return 0;
 }
 
@@ -113,7 +132,7 @@ int CUnknownLoadFactorResultDlg::CheckData()
 
 int CUnknownLoadFactorResultDlg::OnMakeCombination()
 {
-    if (!CheckData()) return 0;
+    if (!CheckData() || !MayWrite()) return 0;
     const std::optional<T_LCOM_D> flat = FlatCombination(m_doc.Data(), m_result.item.combination);
     if (!flat)
         return Refuse(MMSGFunction::Format("IDS_RPS_UNKNOWN_LOAD_LCOM_FAIL", {m_combinationName}));

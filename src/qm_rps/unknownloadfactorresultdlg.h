@@ -44,27 +44,38 @@ public:
     STATE StateOf(std::size_t constraint) const;
     /// Unit of a constraint's value.
     std::string UnitOf(std::size_t constraint) const;
+    /// What is to be said about the values, if anything.
+    std::string Notice() const;
     /// Title of the model.
     std::string ModelTitle() const;
 
     /// For OnExport(path); the file name is that of the model. The date is the caller's to set.
     T_ULF_SHEET_SETTINGS m_sheet;
     [[nodiscard]] int OnExport(const std::string& path) { return OnExport(path, m_sheet); }
-    /// Writes the spreadsheet. 1 done; 0 with a message: too many constraints, or the file can't
-    /// be written (then it is as it was).
+    /// Writes the spreadsheet, factors that miss constraints only when the person wants it. 1 done;
+    /// 0 not wanted, or with a message: too many constraints, or the file can't be written (then it
+    /// is as it was).
     [[nodiscard]] int OnExport(const std::string& path, const T_ULF_SHEET_SETTINGS& settings);
 
+    /// Writes it and opens it in the spreadsheet program. 0: as OnExport, or the program could not
+    /// be started, with a message.
+    [[nodiscard]] int OnOpenSheet(const std::string& path);
+
+    /// Factors that miss constraints are written without a question.
+    bool m_force = false;
     std::string m_combinationName; // of the combination to make
     /// The name is given and free, and the item is no construction-stage one: of loads at stages
     /// there are no combinations. 0: the reason went to the message history.
     int CheckData() override;
-    /// Makes the combination, see AddUlfCombinations. 0: refused (the dialog stays open), or not
-    /// all of them could be added; the message history says what happened.
+    /// Makes the combination, see AddUlfCombinations, of factors that miss constraints only when
+    /// the person wants it. 0: refused (the dialog stays open), or not all of them could be added;
+    /// the message history says what happened.
     [[nodiscard]] int OnMakeCombination();
     /// What the latest making of a combination has come to, in words; empty before it.
     const std::string& Outcome() const { return m_outcome; }
 
 private:
+    bool MayWrite();
     const T_ULF_RESULT_ROW& RowAt(std::size_t constraint) const;
     int Refuse(std::string reason);
 

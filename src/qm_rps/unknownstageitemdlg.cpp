@@ -3,6 +3,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/factors/checks/ulfitemchecks.h"
+#include "qm_rps/factors/checks/ulfstagechecks.h"
 #include "qm_rps/factors/ulfstageplace.h"
 #include "qm_rps/factors/ulfstageresults.h"
 #include "qm_rps/factors/ulfstore.h"
@@ -38,6 +39,7 @@ void CUnknownStageItemDlg::Data2Dlg(const T_ULSI_D& item)
     m_objective = item.objective;
     m_sign = item.sign;
     m_solveByEquations = item.solveByEquations;
+    m_sumStageLoads = item.sumStageLoads;
     m_rows = item.rows;
     // The item's own ones first, in its order, so that a calculation keeps that order.
     SetChecks(item.constraints, true);
@@ -45,7 +47,8 @@ void CUnknownStageItemDlg::Data2Dlg(const T_ULSI_D& item)
 
 T_ULSI_D CUnknownStageItemDlg::Record() const
 {
-    return {m_name, m_rows, m_objective, m_sign, m_solveByEquations, CheckedNames()};
+    return {m_name,         m_rows,         m_objective, m_sign, m_solveByEquations,
+            CheckedNames(), m_sumStageLoads};
 }
 
 int CUnknownStageItemDlg::Dlg2Data(T_ULSI_D& item)
@@ -53,6 +56,15 @@ int CUnknownStageItemDlg::Dlg2Data(T_ULSI_D& item)
     if (!CheckData()) return 0;
     item = Record();
     return 1;
+}
+
+/// What a row of a load group reads: groups 0 and 1 the same.
+std::string CUnknownStageItemDlg::GroupText(int group) const
+{
+    const char* const key = group == kLoadGroupRest ? "IDS_QM_ULSI_READS_OWN"
+                            : m_sumStageLoads       ? "IDS_QM_ULSI_READS_ALL"
+                                                    : "IDS_QM_ULSI_READS_DEAD";
+    return MMSGFunction::Format(key, {std::to_string(group)});
 }
 
 std::string CUnknownStageItemDlg::CellText(std::size_t row, COLUMN column) const
@@ -78,8 +90,8 @@ std::string CUnknownStageItemDlg::CellText(std::size_t row, COLUMN column) const
     default:
         break;
     }
-    const auto group = static_cast<std::size_t>(r.loadGroup);
-    return group < kGroupKeys.size() ? MMSGFunction::GetValue(kGroupKeys[group]) : std::string();
+    return r.loadGroup >= kLoadGroupDead && r.loadGroup <= kLoadGroupRest ? GroupText(r.loadGroup)
+                                                                          : std::string();
 }
 
 std::vector<std::string> CUnknownStageItemDlg::Choices(COLUMN column) const
@@ -93,8 +105,8 @@ std::vector<std::string> CUnknownStageItemDlg::Choices(COLUMN column) const
         for (const auto& entry : model.loadCases)
             texts.push_back(entry.second.name);
     if (column == Group)
-        for (const char* key : kGroupKeys)
-            texts.push_back(MMSGFunction::GetValue(key));
+        for (int group = kLoadGroupDead; group <= kLoadGroupRest; ++group)
+            texts.push_back(GroupText(group));
     return texts;
 }
 
@@ -162,6 +174,11 @@ std::vector<T_FINDING> CUnknownStageItemDlg::Findings() const
     return CheckUlfStageItem(Record(), m_key, m_doc.Data());
 }
 
+std::vector<T_FINDING> CUnknownStageItemDlg::Warnings() const
+{
+    return UlfStageItemWarnings(Record(), m_doc.Data());
+}
+
 int CUnknownStageItemDlg::OnOK()
 {
     T_ULSI_D item;
@@ -194,14 +211,13 @@ T_ULF_CALCULATION CUnknownStageItemDlg::Calculated()
 {
     CUlfStageResults results(m_doc);
     CUlfStageResponse source(results);
-    source.m_sumStageLoads = m_sumStageLoads;
-    return CalculateUlfStages(m_doc, Record(), source);
+    return CalculateUlfStages(m_doc, Record(), source, Dump());
 }
 
 void CUnknownStageItemDlg::OnIterateWindow()
 {
     if (!CheckData()) return;
-    CUlfIterationRunDlg run(m_doc, {m_key, Record(), m_sumStageLoads});
+    CUlfIterationRunDlg run(m_doc, {m_key, Record()});
     run.SetView(View());
     (void)run.DoModal();
 }

@@ -13,9 +13,6 @@ public:
         "IDS_RPS_GXGRID_Stage",        "IDS_RPS_GXGRID_LCase",  "IDS_RPS_GXGRID_Unknown",
         "IDS_RPS_GXGRID_known",        "IDS_RPS_GXGRID_Factor", "IDS_RPS_GXGRID_Weighted_Factor",
         "IDS_QM_ULSI_HEAD_PRETENSION", "IDS_QM_ULSI_HEAD_GROUP"};
-    /// Texts of the load groups, and of the sum of the stage loads.
-    static constexpr std::array<const char*, 3> kGroupKeys{"IDS_RPS_DL", "IDS_RPS_ER",
-                                                           "IDS_QM_ULSI_OWN"};
     /// A row below the grid: how many loads read the dead load, the erection load, and in all.
     struct T_SUMMARY {
         std::string_view key; // of its text
@@ -55,6 +52,7 @@ public:
 
     /// Rules that are not kept; of a row each is told with its number, stage/step and load case.
     std::vector<T_FINDING> Findings() const override;
+    std::vector<T_FINDING> Warnings() const override;
     /// Checks, then stores the item as one edit that can be undone. 0: refused, nothing stored.
     int OnOK() override;
     int Key() const { return m_key; }
@@ -64,6 +62,7 @@ public:
     void OnIterateWindow();
 
 private:
+    std::string GroupText(int group) const;
     [[nodiscard]] int SetChoice(T_ULSI_ROW& row, COLUMN column, const std::string& text) const;
     /// With the stage results at hand.
     T_ULF_CALCULATION Calculated() override;

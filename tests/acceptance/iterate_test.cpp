@@ -97,7 +97,7 @@ TEST_F(Iterate, ExistingReportIsOverwrittenOrAddedToOnlyWhenAsked)
 
 TEST_F(Iterate, RunsAwayNoFurtherThanRequiredAndShowsHow)
 {
-    const T_RUN run = Item("WILD --sum-stage-loads --iterations 2 --json r.json");
+    const T_RUN run = Item("WILD --iterations 2 --json r.json");
     EXPECT_EQ(1, run.code);
     ExpectHolds(run.err, {"not converged"});
     EXPECT_EQ("not converged", Result().at("status"));
@@ -126,15 +126,74 @@ TEST_F(Iterate, FactorsOfOneThatMissTheConstraintsAreNoSuccess)
     EXPECT_NEAR(0.0, Result().at("history").back().at("tolerance"), 1e-9);
 }
 
+// By hand: u = (4 + Q - T f) / 20. The analysis takes what no row reads (Q = 2) and leaves what is
+// no pretension (T stays 1): both runs forecast u = 0.
+TEST_F(Iterate, TheAnalysedStructureStandsBesideTheForecast)
+{
+    const json good = Json("ulf iterate m.json --item STAY");
+    const json& stay = good.at("stays").at(0);
+    EXPECT_EQ(1, stay.at("element"));
+    EXPECT_EQ("N", stay.at("unit"));
+    EXPECT_NEAR(1.0, stay.at("start"), 1e-12);
+    EXPECT_NEAR(4.0, stay.at("factor"), 1e-12);
+    EXPECT_NEAR(4.0, stay.at("pretension"), 1e-12);
+    EXPECT_NEAR(4.0, stay.at("force"), 1e-12) << "the node stays, so that nothing is added";
+    const struct {
+        void (*spoil)(json&);
+        double analysed;
+        const char* warning;
+    } cases[] = {
+        {[](json& d) {
+             d.at("load_cases")
+                 .push_back(
+                     {{"name", "Q"}, {"nodal", {{{"node", 2}, {"load", {2, 0, 0, 0, 0, 0}}}}}});
+             d.at("stages").at(0).at("activate").at("loads").push_back({{"case", "Q"}});
+         },
+         2.0 / 20, "load case Q"},
+        {[](json& d) {
+             d.at("ulf_stage_items").at(0).at("unknown").at(0).at("pretension") = false;
+         },
+         3.0 / 20, "row 1 (S1/First Step T)"},
+    };
+    for (const auto& c : cases) {
+        json document = json::parse(kStageCase);
+        c.spoil(document);
+        Write("m.json", document.dump());
+        ExpectHolds(Done("ulf check m.json --item STAY"), {"warning: ", c.warning, "1 warnings"});
+        const T_RUN run = Item("STAY --overwrite --json r.json");
+        EXPECT_EQ(1, run.code);
+        ExpectHolds(run.err, {c.warning, "the analysed structure is not the one"});
+        ExpectHolds(run.out, {"HOLD (S1/Last Step)", "differs"});
+        EXPECT_EQ("analysed structure differs", Result().at("status"));
+        const json& row = Result().at("analysed").at(0);
+        EXPECT_NEAR(0.0, row.at("forecast"), 1e-9);
+        EXPECT_NEAR(c.analysed, row.at("analysed"), 1e-9);
+        EXPECT_EQ("m", row.at("unit"));
+    }
+}
+
+TEST_F(Iterate, ModelsThatAreThereAreNotOverwrittenUnasked)
+{
+    Write("m_02.json", "mine\n");
+    ExpectRefused("ulf iterate m.json --item STAY", 4, "m_02.json");
+    ExpectRefused("ulf iterate m.json --item STAY --append", 4, "--overwrite");
+    EXPECT_EQ((NAMES{"m.json", "m_02.json"}), m_folder.Names());
+    EXPECT_EQ(0, Item("STAY --iterations 1").code) << "it is not written then";
+    EXPECT_EQ("mine\n", Text("m_02.json"));
+    Write("case.ulf", kStageCase);
+    ExpectRefused("ulf iterate case.ulf --item STAY --overwrite", 2, "over the model");
+    EXPECT_EQ(kStageCase, Text("case.ulf"));
+}
+
 TEST_F(Iterate, StopsWhereACopyCannotBeWritten)
 {
     std::filesystem::create_directory(m_folder / "m_02.json");
-    const T_RUN run = Item("DOUBLE --json r.json");
+    const T_RUN run = Item("FADE --overwrite --json r.json");
     EXPECT_EQ(4, run.code);
     EXPECT_EQ(1U, Lines(run.err).size()) << run.err;
     ExpectHolds(run.err, {"m_02.json"});
     EXPECT_EQ(kStageCase, Text("m.json"));
-    EXPECT_NEAR(2.0, Tension("m_01.json"), 1e-12) << "as after the iteration before";
+    EXPECT_NEAR(2.0 / 3, Tension("m_01.json"), 1e-12) << "as after the iteration before";
     EXPECT_EQ(2U, Blocks(Text("m.ulf")));
     EXPECT_EQ(2U, Result().at("history").size());
     EXPECT_EQ((NAMES{"m.json", "m.ulf", "m_01.json", "m_02.json", "r.json"}), m_folder.Names());
@@ -145,7 +204,7 @@ TEST_F(Iterate, InterruptedItEndsAfterACompleteIteration)
     // The report is a pipe, so that the program waits for a reader with each block; it is
     // interrupted while it waits with a block of an iteration.
     const T_RUN run =
-        RunShell("mkfifo m.ulf; qm-rps ulf iterate m.json --item DOUBLE --iterations 60 --append "
+        RunShell("mkfifo m.ulf; qm-rps ulf iterate m.json --item FADE --iterations 60 --append "
                  "--json r.json & pid=$!; (sleep 30; kill -KILL $pid) >/dev/null 2>&1 & guard=$!; "
                  "timeout 10 cat m.ulf > all; sleep 0.5; kill -INT $pid; "
                  "timeout 10 cat m.ulf >> all; wait $pid; code=$?; kill $guard; exit $code",
@@ -158,7 +217,8 @@ TEST_F(Iterate, InterruptedItEndsAfterACompleteIteration)
     ASSERT_LT(last, 9U) << "it was not stopped by the interrupt";
     EXPECT_EQ(last + 1, Blocks(Text("all")));
     EXPECT_TRUE(Text("all").ends_with("===\n\n\n")) << "its last block is complete";
-    EXPECT_NEAR(std::pow(2.0, double(last)), Tension("m_0" + std::to_string(last) + ".json"), 1e-9);
+    EXPECT_NEAR(2 / (1 + std::pow(2.0, double(last))),
+                Tension("m_0" + std::to_string(last) + ".json"), 1e-9);
     EXPECT_FALSE(std::filesystem::exists(m_folder / ("m_0" + std::to_string(last + 1) + ".json")));
     EXPECT_EQ(kStageCase, Text("m.json"));
 }

@@ -46,11 +46,9 @@ TEST_F(StageUlf, SolvesFromACaseFileAndFromAModelFile)
     // The square of T = 2.
     EXPECT_NEAR(4.0, Json("ulf solve c.json --item LEAST").at("objective"), 1e-8);
     ExpectHolds(Done("ulf solve c.json --item LEAST"), {"stage/step case"});
-    // From all loads: u = (4 - T) / 20 = 3 / 20 at T = 1, so 0.2 is 4/3 of it; 1 from G alone.
-    for (const auto& [flag, factor] : {std::pair{"--sum-stage-loads", 4.0 / 3}, {"", 1.0}}) {
-        const json r = Json(std::string("ulf solve c.json --item WILD ") + flag);
-        EXPECT_NEAR(factor, r.at("factors").at("S1/First Step T"), 1e-12) << flag;
-    }
+    // From all loads, as the item says: u = (4 - T) / 20 = 3 / 20 at T = 1, so 0.2 is 4/3 of it.
+    EXPECT_NEAR(4.0 / 3, Json("ulf solve m.qmdb --item WILD").at("factors").at("S1/First Step T"),
+                1e-12);
 }
 
 TEST_F(StageUlf, ExplainsWhatHoldsTheFactor)
@@ -107,6 +105,33 @@ TEST_F(StageUlf, RefusesANameOfBothKinds)
     const T_RUN check = Run("ulf check c.json --item STAY");
     EXPECT_EQ(1, check.code);
     ExpectHolds(check.out, {"2 items, 2 findings"});
+}
+
+TEST_F(StageUlf, AConstraintThatIsNamedTwiceIsTold)
+{
+    Spoil([](json& d) { d.at("ulf_stage_items").at(0).at("constraints").push_back("HOLD"); });
+    ExpectHolds(Run("ulf check c.json --item STAY").out, {"named twice"});
+    ExpectRefused("ulf solve c.json --item STAY", 3, "named twice");
+}
+
+TEST_F(StageUlf, TheProblemOfTheSolverIsDumpedOnRequest)
+{
+    Done("ulf solve c.json --item STAY --dump");
+    // By hand: -T / 20 = -4 / 20.
+    ExpectHolds(Text("c_[EXACT].out"),
+                {"NVAR  = 1", "NEQ   = 1", "RHS8(1) = -0.200000", "COEFVEC(1) = -0.050000"});
+}
+
+TEST_F(StageUlf, AForecastOfAModelThatIsNotLinearIsCalledOne)
+{
+    const std::string note = "linear forecast";
+    EXPECT_EQ(std::string::npos, Done("ulf solve c.json --item STAY").find(note));
+    Spoil([](json& d) {
+        d["stage_control"] = {{"birth", "deformed"}, {"geometric_stiffness", true}};
+    });
+    ExpectHolds(Done("ulf solve c.json --item STAY"), {"forecast", note.c_str()});
+    EXPECT_TRUE(Json("ulf solve c.json --item STAY").at("linear_forecast"));
+    ExpectHolds(Done("ulf iterate c.json --item STAY"), {note.c_str()});
 }
 
 TEST_F(StageUlf, TellsWhyTheStagesCannotBeAnalysed)

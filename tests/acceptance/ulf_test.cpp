@@ -2,6 +2,7 @@
 // the combination and its way back, contradictions, refusals.
 #include "office.h"
 #include "program.h"
+#include "stagecase.h"
 
 #include <functional>
 #include <set>
@@ -39,7 +40,7 @@ TEST_F(Ulf, ResultHasTheDocumentedKeysInTheirOrder)
     for (const auto& part : r.at("constraints").at(0).items())
         keys += " " + part.key();
     EXPECT_EQ("status code message mode factors constraints objective "
-              " name value upper lower residual active",
+              " name value unit upper lower residual active",
               keys);
     EXPECT_EQ("[OPTIMIZE]", r.at("mode"));
 }
@@ -143,6 +144,48 @@ TEST_F(Ulf, PicturesShowEveryConstraintAndBothShapes)
     ExpectHolds(Text("s.svg"), {"known load cases alone", "with the factors found", "Undeformed"});
 }
 #endif
+
+// P moves node 2 by 1/20 a unit, to 0 and to 0.2 at once: the equations are met between.
+TEST_F(Ulf, FactorsThatMissConstraintsAreWrittenOnlyWhenForced)
+{
+    json d = json::parse(kStageCase);
+    d["load_cases"].push_back(
+        {{"name", "P"}, {"nodal", {{{"node", 2}, {"load", {1, 0, 0, 0, 0, 0}}}}}});
+    d["load_cases"].push_back(
+        {{"name", "R"}, {"nodal", {{{"node", 2}, {"load", {2, 0, 0, 0, 0, 0}}}}}});
+    d["combinations"] = {
+        {{"name", "C"},
+         {"items", {{{"case", "P"}, {"factor", 1}}, {{"case", "R"}, {"factor", 1}}}}}};
+    d["ulf_items"] = {{{"name", "BOTH"},
+                       {"combination", "C"},
+                       {"objective", "linear"},
+                       {"unknown", {{{"case", "P"}}, {{"case", "R"}}}},
+                       {"constraints", {"U01", "U02"}}}};
+    Write("c.json", d.dump());
+    for (const std::string action : {"ulf export c.json --item BOTH -o s.xlsx",
+                                     "ulf combine c.json --item BOTH --name N -o n.json"}) {
+        ExpectRefused(action, 1, "U01, U02");
+        EXPECT_EQ(std::vector<std::string>{"c.json"}, m_folder.Names());
+    }
+    ExpectHolds(Run("ulf export c.json --item BOTH -o s.xlsx --force").err, {"U01, U02"});
+    Done("ulf combine c.json --item BOTH --name N -o n.json --force");
+    EXPECT_EQ((std::vector<std::string>{"c.json", "n.json", "s.xlsx"}), m_folder.Names());
+}
+
+TEST_F(Ulf, TheSheetIsOpenedOnRequestOrItIsSaidThatItCanNot)
+{
+    std::filesystem::create_directory(m_folder / "bin");
+    for (const int code : {0, 3}) { // of the desktop's program
+        Write("bin/xdg-open",
+              "#!/bin/sh\necho \"$1\" > opened\nexit " + std::to_string(code) + "\n");
+        const T_RUN run = Run("ulf export @tuned-beam --item PROPS -o s.xlsx --open",
+                              "chmod +x bin/xdg-open; export PATH=\"$PWD/bin:$PATH\"; ");
+        EXPECT_EQ(code == 0 ? 0 : 4, run.code) << run.err;
+        EXPECT_EQ("s.xlsx\n", Text("opened"));
+        EXPECT_EQ(code != 0, run.err.ends_with("Couldn't start Excel.\n"));
+        EXPECT_TRUE(std::filesystem::exists(m_folder / "s.xlsx"));
+    }
+}
 
 TEST_F(Ulf, RefusalsHaveTheirExitCodesAndLeaveNothing)
 {

@@ -57,6 +57,12 @@ TEST_F(UlfIterationWindows, TwoHangersConvergeInTheWindowOfTheRun)
         EXPECT_NEAR(2.5, Cell(Table(w, 1), 0, 4).toDouble(), 1e-6);
         EXPECT_NEAR(0.75, Cell(Table(w, 1), 1, 4).toDouble(), 1e-6);
         EXPECT_NEAR(1.0, Cell(Table(w, 1), 0, 2).toDouble(), 1e-6);
+        // Hanger 11 in kN: 100 at the start, 250 now, and as a level support it carries that; the
+        // node that it holds is level in the analysed structure as well.
+        EXPECT_EQ("100", Cell(Table(w, 2), 0, 2));
+        EXPECT_NEAR(250.0, Cell(Table(w, 2), 0, 4).toDouble(), 1e-3);
+        EXPECT_NEAR(250.0, Cell(Table(w, 2), 0, 5).toDouble(), 1e-3);
+        EXPECT_NEAR(0.0, Cell(Table(w, 3), 0, 2).toDouble(), 1e-9);
         ChooseRow(w, 0); // the first solution
         EXPECT_NEAR(2.5, Cell(Table(w, 1), 0, 2).toDouble(), 1e-6);
         EXPECT_EQ(2U, Picture(w).series.at(0).x.size());

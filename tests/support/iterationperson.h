@@ -31,6 +31,11 @@ public:
         m_reports.push_back(report);
         return m_overwrite;
     }
+    bool MayReplace(const std::string& copy) override
+    {
+        m_reports.push_back(copy);
+        return m_overwrite;
+    }
     bool GoesOn(int done, int required) override
     {
         EXPECT_EQ(m_thread, std::this_thread::get_id());

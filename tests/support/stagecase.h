@@ -5,8 +5,9 @@
 #include <string>
 
 /// Items, by hand: "STAY" u = 0, so T = 4; "LEAST" u <= 0.1 with a positive factor, so T = 2;
-/// "SIGN" u = 0 with a negative factor: none; "DOUBLE" twice the dead load's u, whatever T is: 2
-/// each time; "WILD" u = 0.2 from all loads: 4 / (4 - T), which runs away from T = 1: 4/3, 1.5, 2.
+/// "SIGN" u = 0 with a negative factor: none; "FADE" u = 0.1 from all loads: 2 / (4 - T), so that T
+/// fades as 2 / (1 + 2^k) and the factor goes to 1/2; "WILD" u = 0.2 from all loads: 4 / (4 - T),
+/// which runs away from T = 1: 4/3, 1.5, 2.
 inline const std::string kStageCase = R"({
  "format": "qm-rps case 1", "title": "Two trusses", "units": {"force": "N", "length": "m"},
  "nodes": [{"id": 1, "xyz": [0, 0, 0], "restraint": [1, 1, 1, 1, 1, 1]},
@@ -23,7 +24,7 @@ inline const std::string kStageCase = R"({
  "ulf_constraints": [
   {"name": "HOLD", "type": "displacement", "id": 2, "component": "DX", "equal": 0, "stage": "S1"},
   {"name": "MOST", "type": "displacement", "id": 2, "component": "DX", "upper": 0.1},
-  {"name": "U04", "type": "displacement", "id": 2, "component": "DX", "equal": 0.4},
+  {"name": "U01", "type": "displacement", "id": 2, "component": "DX", "equal": 0.1},
   {"name": "U02", "type": "displacement", "id": 2, "component": "DX", "equal": 0.2}],
  "ulf_stage_items": [
   {"name": "STAY", "objective": "linear", "constraints": ["HOLD"],
@@ -35,8 +36,8 @@ inline const std::string kStageCase = R"({
   {"name": "SIGN", "objective": "linear", "sign": "negative", "constraints": ["HOLD"],
    "unknown": [{"stage": "S1", "case": "T", "pretension": true}],
    "known": [{"stage": "S1", "case": "G", "load_group": 0}]},
-  {"name": "DOUBLE", "objective": "linear", "constraints": ["U04"],
+  {"name": "FADE", "objective": "linear", "constraints": ["U01"], "sum_stage_loads": true,
    "unknown": [{"stage": "S1", "case": "T", "pretension": true, "load_group": 0}]},
-  {"name": "WILD", "objective": "linear", "constraints": ["U02"],
+  {"name": "WILD", "objective": "linear", "constraints": ["U02"], "sum_stage_loads": true,
    "unknown": [{"stage": "S1", "case": "T", "pretension": true, "load_group": 0}]}]
 })";

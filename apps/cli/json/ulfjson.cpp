@@ -25,7 +25,7 @@ void Write(CJsonText& w, const std::optional<T_ULF_RESULT>& r)
         w.Object(kJsonOneLine);
         w.Member("name", row.name);
         if (!row.place.empty()) w.Member("place", row.place);
-        w.Member("value", row.value + 0.0);
+        w.Member("value", row.value + 0.0).Member("unit", row.unit);
         w.Member("upper", Tidy(row.upper)).Member("lower", Tidy(row.lower));
         w.Member("residual", row.residual + 0.0).Member("active", row.active);
         w.End();
@@ -53,6 +53,7 @@ std::string UlfJson(const T_ULF_OUTCOME& o, const std::optional<T_ULF_RESULT>& r
     w.Member("mode", o.exact ? "[EXACT]" : "[OPTIMIZE]");
     Write(w, r);
     w.Member("objective", r ? std::optional(UlfObjective(*r)) : std::nullopt);
+    if (r && r->linearForecast) w.Member("linear_forecast", true);
     w.End();
     return w.Text();
 }
@@ -69,6 +70,7 @@ std::string ExplainJson(const T_ULF_EXPLAINED& e)
     for (const T_ULF_HOLD& h : e.held) {
         WriteLimit(w, h);
         w.Member("multiplier", h.multiplier + 0.0);
+        w.Member("raised", h.raised).Member("lowered", h.lowered).Member("part", h.part);
         w.End();
     }
     w.End();
@@ -78,7 +80,8 @@ std::string ExplainJson(const T_ULF_EXPLAINED& e)
         w.End();
     }
     w.End();
-    w.Member("conflict_with_sign", e.conflictWithSign).Key("compromise");
+    w.Member("conflict_with_sign", e.conflictWithSign).Member("not_proved", e.notProved);
+    w.Key("compromise");
     if (e.compromise) {
         w.Object({1, 1});
         Write(w, e.compromise);

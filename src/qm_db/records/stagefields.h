@@ -53,6 +53,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_ULSI_D> r)
     v.Enum("objective", r.objective, kObjectiveNames, "IDS_QM_CHOICE_OBJECTIVE");
     v.EnumOpt("sign", r.sign, 1, kSignNames, "IDS_QM_CHOICE_SIGN");
     v.Opt("solve_by_equations", r.solveByEquations, false);
+    v.Opt("sum_stage_loads", r.sumStageLoads, false);
     std::vector<T_ULSI_ROW> unknown, known;
     for (const T_ULSI_ROW& row : r.rows)
         (row.unknown ? unknown : known).push_back(row);

@@ -75,7 +75,7 @@ struct T_ULSI_ROW {
     double factor = 1.0;            // of a known load
     double weight = 1.0;            // of an unknown one, in the objective function
     bool pretension = false;        // the unknown scales pretension loads
-    int loadGroup = kLoadGroupRest; // whose stage result the row reads; 2: that of its own case
+    int loadGroup = kLoadGroupRest; // what it reads: 0, 1 a sum of stage loads; 2 its own case
     bool operator==(const T_ULSI_ROW&) const = default;
 };
 
@@ -87,5 +87,6 @@ struct T_ULSI_D {
     int sign = 1;                         // 0 negative, 1 free, 2 positive; ISIGN is one less
     bool solveByEquations = false;        // as simultaneous equations
     std::vector<std::string> constraints; // names of those that take part, in their order
+    bool sumStageLoads = false;           // load groups 0 and 1 read the sum of all stage loads
     bool operator==(const T_ULSI_D&) const = default;
 };

@@ -6,6 +6,7 @@
 #include "qm_solver/ulfdiagnosis.h"
 
 #include <algorithm>
+#include <cmath>
 
 using zql::lib::MMSGFunction;
 
@@ -75,6 +76,8 @@ private:
         return UlfUnitText(c.type, c.component, m_units);
     }
 
+    /// 1 % of a limit, or of the largest term of its row where the limit is 0.
+    double PartOf(int row, double limit, const std::vector<double>& factors) const;
     int Examine();
     int ExplainSolution();
     void ExplainFailure(const std::function<bool(int, int)>& progress);
@@ -105,6 +108,18 @@ int CExplainer::Examine()
     return 1;
 }
 
+double CExplainer::PartOf(int row, double limit, const std::vector<double>& factors) const
+{
+    constexpr double kPart = 0.01;
+    double size = std::fabs(limit);
+    const bool isZero = !(size > 0.0);
+    for (std::size_t j = 0; isZero && j < factors.size(); ++j) {
+        const double entry = m_system.matrix[static_cast<std::size_t>(row) * factors.size() + j];
+        size = std::max(size, std::fabs(entry * factors[j]));
+    }
+    return kPart * size;
+}
+
 int CExplainer::ExplainSolution()
 {
     // Equations are solved without the sign restriction, which only judges their factors.
@@ -117,8 +132,13 @@ int CExplainer::ExplainSolution()
         const T_PLACE_OF_ROW place = PlaceOf(row.index);
         // A lower bound was handed over turned round.
         const double turn = place.limit == LIMIT::Lower ? -1.0 : 1.0;
-        m_out.held.push_back({place.constraint->name, place.limit, place.value,
-                              UnitOf(*place.constraint), turn * row.multiplier});
+        T_ULF_HOLD hold{place.constraint->name, place.limit, place.value, UnitOf(*place.constraint),
+                        turn * row.multiplier};
+        const bool isTurned = place.limit == LIMIT::Lower;
+        hold.raised = isTurned ? row.lowered : row.raised;
+        hold.lowered = isTurned ? row.raised : row.lowered;
+        hold.part = PartOf(row.index, place.value, e.factors);
+        m_out.held.push_back(std::move(hold));
     }
     for (const T_ULF_HELD& held : e.signs)
         m_out.held.push_back({CaseName(held.index), LIMIT::Sign, 0.0, {}, -held.multiplier});
@@ -131,6 +151,7 @@ void CExplainer::ExplainFailure(const std::function<bool(int, int)>& progress)
     const T_ULF_CONFLICT conflict = CUlfDiagnosis().Conflict(problem, progress);
     m_out.contradicts = conflict.state == ULF_CONFLICT::Found;
     m_out.cancelled = conflict.state == ULF_CONFLICT::Cancelled;
+    m_out.notProved = conflict.state == ULF_CONFLICT::NotProved;
     if (m_out.contradicts) {
         for (const int row : conflict.rows) {
             const T_PLACE_OF_ROW place = PlaceOf(row);
@@ -162,11 +183,14 @@ void CExplainer::TellSolution()
             Tell("IDS_QM_ULF_HELD_BY_SIGN", {h.name, Number(h.multiplier)});
             continue;
         }
-        // What relaxing buys: a lower bound relaxes downwards.
-        const bool down = h.limit == LIMIT::Lower;
-        Tell(down ? "IDS_QM_ULF_HELD_LOWER" : "IDS_QM_ULF_HELD",
-             {LimitText(h.name, h.limit, h.value, h.unit), h.unit,
-              Number(down ? -h.multiplier : h.multiplier)});
+        const std::string limit = LimitText(h.name, h.limit, h.value, h.unit);
+        const auto change = [&](const std::optional<double>& price) {
+            return price ? FormatText("%+.4g", *price * h.part + 0.0)
+                         : MMSGFunction::GetValue("IDS_QM_ULF_NO_SOLUTION_LEFT");
+        };
+        const bool isZero = !(std::fabs(h.value) > 0.0);
+        Tell(isZero ? "IDS_QM_ULF_HELD_AT_ZERO" : "IDS_QM_ULF_HELD",
+             {limit, Number(h.part), h.unit, change(h.raised), change(h.lowered)});
     }
 }
 
@@ -182,7 +206,7 @@ void CExplainer::TellFailure()
                        MMSGFunction::GetValue("IDS_QM_ULF_SIGN_RESTRICTION");
         Tell("IDS_QM_ULF_CONFLICT", {members});
     } else if (!m_out.cancelled) {
-        Tell("IDS_QM_ULF_NO_CONFLICT", {});
+        Tell(m_out.notProved ? "IDS_QM_ULF_NOT_PROVED" : "IDS_QM_ULF_NO_CONFLICT", {});
     }
     if (!m_out.compromise) return;
     std::string factors;

@@ -16,6 +16,10 @@ struct T_ULF_HOLD {
     /// Change of the objective when the limit rises by one unit (a sign restriction: when the
     /// factor may go one beyond 0 to the side that is not allowed).
     double multiplier = 0.0;
+    /// Of a limit, what one unit to each side changes at first; empty: no solution is left, or it
+    /// was not tried (see kUlfMostPriced).
+    std::optional<double> raised{}, lowered{};
+    double part = 0.0; // 1 % of the limit; of a limit of 0, of what makes up the row
     bool operator==(const T_ULF_HOLD&) const = default;
 };
 
@@ -42,6 +46,7 @@ struct T_ULF_EXPLAINED {
     bool contradicts = false;          // no factors satisfy all constraints
     std::vector<T_ULF_CLASH> conflict; // smallest set that contradicts itself
     bool conflictWithSign = false;     // the sign restriction is part of it
+    bool notProved = false;            // nearly parallel rows leave open whether they contradict
     bool cancelled = false;            // the search for it was cancelled
 
     /// No solution: the factors that miss the constraints least (least squares of the misses

@@ -94,10 +94,25 @@ int CUlfIteration::Analyse(int iteration)
                            : (saved ? ULF_ITER_END::Cancelled : ULF_ITER_END::NotSaved));
 }
 
+int CUlfIteration::SaveCopy(int iteration)
+{
+    const std::string copy = UlfIterCopyPath(m_model, iteration);
+    std::error_code ignored;
+    if (!m_replaces && std::filesystem::exists(copy, ignored)) {
+        m_replaces = m_person.MayReplace(copy);
+        if (!m_replaces) {
+            m_said.emplace();
+            m_said->messageKey = "IDS_QM_ULF_COPY_KEPT";
+            m_said->text = MMSGFunction::Format(m_said->messageKey, {copy});
+            return Stop(ULF_ITER_END::NotSaved);
+        }
+    }
+    return m_host.SaveCopy(copy) ? 1 : Stop(ULF_ITER_END::NotSaved);
+}
+
 int CUlfIteration::Iterate(int iteration)
 {
-    if (!m_host.SaveCopy(UlfIterCopyPath(m_model, iteration))) return Stop(ULF_ITER_END::NotSaved);
-    if (!Scale() || !Analyse(iteration) || !Solve(iteration)) return 0;
+    if (!SaveCopy(iteration) || !Scale() || !Analyse(iteration) || !Solve(iteration)) return 0;
     if (!AddToReport(UlfIterBlock(m_history.back()))) return 0;
     if (m_settings.tolerance >= m_history.back().tolerance) return Stop(ULF_ITER_END::Converged);
     return AskForMore();
@@ -108,6 +123,7 @@ int CUlfIteration::Run()
     m_history.clear();
     m_said.reset();
     m_asks = true;
+    m_replaces = false;
     m_model = m_host.ModelPath();
     m_report = UlfIterReportPath(m_model);
     // The question comes before the report: who declines here leaves no report.

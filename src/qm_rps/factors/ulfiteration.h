@@ -50,6 +50,7 @@ private:
     [[nodiscard]] int AddToReport(const std::string& text);
     int RefuseReport();
     [[nodiscard]] int AskForMore();
+    [[nodiscard]] int SaveCopy(int iteration);
     [[nodiscard]] int Scale();
     [[nodiscard]] int Analyse(int iteration);
     /// 1 one more iteration is to follow; 0 stopped, m_end set.
@@ -60,8 +61,9 @@ private:
     T_ULF_ITER_SETTINGS m_settings;
     std::vector<T_ULF_ITER_STEP> m_history;
     std::optional<T_FINDING> m_said;
-    bool m_asks = true;  // the person is asked before each iteration
-    std::string m_model; // path at the start: copies are numbered from it
+    bool m_asks = true;      // the person is asked before each iteration
+    bool m_replaces = false; // copies may be written over models that are there
+    std::string m_model;     // path at the start: copies are numbered from it
     std::string m_report;
     std::string m_reportText; // as in the file
     ULF_ITER_END m_end = ULF_ITER_END::Declined;

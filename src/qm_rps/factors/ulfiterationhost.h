@@ -62,6 +62,9 @@ public:
     virtual ULF_ITER_WISH Wish(const T_ULF_ITER_STEP& step) = 0;
     /// May the report that stands there be overwritten? Else it is added to.
     virtual bool MayOverwrite(const std::string& report) = 0;
+    /// May a model that has the name of a copy be overwritten? Asked before the first one that is
+    /// there; the answer goes for all copies of the run.
+    virtual bool MayReplace(const std::string& copy) = 0;
     /// Told before each iteration, and again and again while its analysis runs (so that a window
     /// stays alive), with the number of those done; false cancels the run, the model and its file
     /// being as after the last complete iteration.

@@ -9,6 +9,7 @@ namespace {
 
 constexpr double kActiveTolerance = 1e-8; // of the row's scale
 constexpr double kMetTolerance = 1e-6;    // likewise
+constexpr double kZeroTolerance = 1e-12;  // likewise: what rounding has left of a zero
 
 } // namespace
 
@@ -32,10 +33,13 @@ T_ULF_RESULT UlfResultOf(const T_ULF_RUN& run, std::span<const double> factors)
         r.constraints.push_back(UlfResultConstraint(c));
     for (std::size_t i = 0; i < run.places.size(); ++i)
         r.constraints[i].place = run.places[i];
+    for (std::size_t i = 0; i < run.units.size(); ++i)
+        r.constraints[i].unit = run.units[i];
     r.influence = run.influence;
     r.exact = run.answer.exact;
     r.code = run.answer.code;
     r.stage = run.formed.problem.stage;
+    r.linearForecast = run.linearForecast;
     return r;
 }
 
@@ -63,8 +67,18 @@ double UlfScale(const T_ULF_RESULT& r, std::size_t i)
 
 double UlfShown(double value, double scale)
 {
-    constexpr double kZero = 1e-12; // of the row's scale
-    return std::fabs(value) <= kZero * scale ? 0.0 : value + 0.0;
+    return std::fabs(value) <= kZeroTolerance * scale ? 0.0 : value + 0.0;
+}
+
+double UlfShownFactor(const T_ULF_RESULT& r, std::size_t j)
+{
+    bool isFelt = false;
+    for (std::size_t i = 0; i < r.influence.size(); ++i) {
+        const double part = std::fabs(r.influence[i][j] * r.factors[j]);
+        if (part > kZeroTolerance * UlfScale(r, i)) return r.factors[j];
+        isFelt |= std::fabs(r.influence[i][j]) > 0.0;
+    }
+    return isFelt ? 0.0 : r.factors[j] + 0.0;
 }
 
 std::vector<T_ULF_RESULT_ROW> UlfResultRows(const T_ULF_RESULT& r)
@@ -74,6 +88,7 @@ std::vector<T_ULF_RESULT_ROW> UlfResultRows(const T_ULF_RESULT& r)
         const T_ULF_RESULT_CONSTRAINT& c = r.constraints[i];
         T_ULF_RESULT_ROW row{c.name, c.description, UlfValue(r, i), c.upper, c.lower};
         row.place = c.place;
+        row.unit = c.unit;
         const double scale = UlfScale(r, i);
         const auto at = [&](const std::optional<double>& bound) {
             return bound && std::fabs(row.value - *bound) <= kActiveTolerance * scale;
@@ -86,6 +101,14 @@ std::vector<T_ULF_RESULT_ROW> UlfResultRows(const T_ULF_RESULT& r)
         rows.push_back(std::move(row));
     }
     return rows;
+}
+
+std::string UlfMisses(const T_ULF_RESULT& r)
+{
+    std::string names;
+    for (const T_ULF_RESULT_ROW& row : UlfResultRows(r))
+        if (!row.met) names += (names.empty() ? "" : ", ") + UlfNameAt(row.name, row.place);
+    return names;
 }
 
 double UlfObjective(const T_ULF_RESULT& r)

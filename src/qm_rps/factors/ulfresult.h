@@ -11,6 +11,7 @@ struct T_ULF_RESULT_CONSTRAINT {
     /// What cases outside the table contribute; in a static analysis all cases stand in the table.
     std::optional<double> constant{};
     std::string place{}; // stage and step where it is read, of one that names them
+    std::string unit{};  // of value and bounds
     bool operator==(const T_ULF_RESULT_CONSTRAINT&) const = default;
 };
 
@@ -23,6 +24,9 @@ struct T_ULF_RESULT {
     bool exact = false;                               // solved as equations
     int code = 0;                                     // of the solver
     bool stage = false; // the cases are loads at a construction stage and step
+    /// The values are sums of results of a model that is analysed with geometric stiffness or sag:
+    /// other tensions change its stiffness, and then they hold to the first order alone.
+    bool linearForecast = false;
 };
 
 inline auto Numbers(const T_ULF_RESULT& r)
@@ -39,6 +43,8 @@ struct T_ULF_RUN {
     T_OPT_ANSWER answer;
     std::vector<std::vector<double>> influence; // per constraint: response of every case
     std::vector<std::string> places{};          // of the constraints; empty in a static analysis
+    std::vector<std::string> units{};           // of the constraints
+    bool linearForecast = false;                // see T_ULF_RESULT
 };
 
 /// What a calculation has come to.
@@ -65,6 +71,7 @@ struct T_ULF_RESULT_ROW {
     bool active = false; // at a bound, to 1e-8 of the row's scale
     bool met = true;     // residual within 1e-6 of the row's scale
     std::string place{}; // as of the constraint
+    std::string unit{};  // likewise
     bool operator==(const T_ULF_RESULT_ROW&) const = default;
 };
 inline auto Numbers(const T_ULF_RESULT_ROW& r)
@@ -88,9 +95,16 @@ double UlfScale(const T_ULF_RESULT& result, std::size_t constraint);
 /// For tables: what rounding has left of a zero is shown as 0.
 double UlfShown(double value, double scale);
 
+/// The factor of a case for tables: 0 where what it contributes to every constraint that feels it
+/// is rounding.
+double UlfShownFactor(const T_ULF_RESULT& result, std::size_t loadCase);
+
 /// One row per user constraint. A row's scale: the largest of its bounds and the sum of the
 /// absolute contributions of the cases.
 std::vector<T_ULF_RESULT_ROW> UlfResultRows(const T_ULF_RESULT& result);
+
+/// Names of the constraints that are not met, with their places; empty: all are.
+std::string UlfMisses(const T_ULF_RESULT& result);
 
 /// Value of the item's objective: sum of |w x|, sum of (w x)^2, or largest |w x|.
 double UlfObjective(const T_ULF_RESULT& result);

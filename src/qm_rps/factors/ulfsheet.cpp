@@ -1,11 +1,15 @@
 #include "qm_rps/factors/ulfsheet.h"
 
+#include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+
+using zql::lib::MMSGFunction;
 
 namespace {
 
 // Rows and columns from 0: row 8 of the sheet is 7.
-constexpr std::size_t kNameRow = 7, kUpperRow = 8, kLowerRow = 9, kValueRow = 10, kCaseRow = 11;
+constexpr std::size_t kUnitRow = 6, kNameRow = 7, kUpperRow = 8, kLowerRow = 9, kValueRow = 10,
+                      kCaseRow = 11;
 constexpr std::size_t kCaptionColumn = 1, kFirstColumn = 2;
 
 struct T_LIMIT {
@@ -56,6 +60,8 @@ void PutHead(CWriter& put, const T_ULF_RESULT& r, const T_ULF_SHEET_SETTINGS& s)
     put.Put(3, 3, FormatText("Date : %d/%d/%d", s.year, s.month, s.day));
     put.Put(4, 0, FormatText("Number of Constraints : %d", static_cast<int>(r.constraints.size())));
     put.Put(4, 3, FormatText("Number of Load Cases : %d", static_cast<int>(r.cases.size())));
+    if (r.linearForecast) put.Put(5, 0, MMSGFunction::GetValue("IDS_QM_ULF_LINEAR_FORECAST"));
+    put.PutCentred(kUnitRow, kCaptionColumn, "Unit");
     put.PutCentred(kNameRow, kCaptionColumn, "Constraint");
     put.PutCentred(kUpperRow, kCaptionColumn, "Upper Bound");
     put.PutCentred(kLowerRow, kCaptionColumn, "Lower Bound");
@@ -67,6 +73,7 @@ void PutConstraint(CWriter& put, const T_ULF_RESULT& r, std::size_t i)
 {
     const T_ULF_RESULT_CONSTRAINT& c = r.constraints[i];
     const std::size_t column = kFirstColumn + i;
+    if (!c.unit.empty()) put.PutCentred(kUnitRow, column, c.unit);
     put.PutCentred(kNameRow, column, UlfNameAt(c.name, c.place));
     if (c.upper) put.Put(kUpperRow, column, *c.upper);
     if (c.lower) put.Put(kLowerRow, column, *c.lower);
@@ -99,7 +106,7 @@ int MakeUlfSheet(const T_ULF_RESULT& r, const T_ULF_SHEET_SETTINGS& settings, T_
     PutHead(put, r, settings);
     for (std::size_t j = 0; j < r.cases.size(); ++j) {
         put.PutCentred(kCaseRow + j, 0, r.cases[j].name);
-        put.Put(kCaseRow + j, kCaptionColumn, r.factors[j]).style.input = true;
+        put.Put(kCaseRow + j, kCaptionColumn, UlfShownFactor(r, j)).style.input = true;
     }
     for (std::size_t i = 0; i < r.constraints.size(); ++i)
         PutConstraint(put, r, i);

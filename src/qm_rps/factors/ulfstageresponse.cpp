@@ -12,7 +12,7 @@ using zql::lib::MMSGFunction;
 namespace {
 
 constexpr const char* kSumOfAll = "IDS_DB_SGLD_SUM";
-/// Load groups 0 and 1 both read the dead load: this is meant.
+/// Load groups 0 and 1 both read it. UlfStageItem rules refuse a row whose load is not in it.
 constexpr const char* kDeadSum = "IDS_DB_SGLD_DL";
 
 bool HasResponse(int group)

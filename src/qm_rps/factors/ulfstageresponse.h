@@ -22,9 +22,9 @@ public:
     virtual std::string Error() const = 0;
 };
 
-/// An item reads, by its load group: 0 and 1 both the dead-load sum, which is meant (the sum of all
-/// stage loads when those are summed), 2 its own load; any other group gives 0. A quantity that
-/// names a stage and step is read there, any other one at those of the item.
+/// An item reads, by its load group: 0 and 1 both the dead-load sum (the sum of all stage loads
+/// when those are summed), whatever its own load, 2 its own load; any other group gives 0. A
+/// quantity that names a stage and step is read there, any other one at those of the item.
 class CUlfStageResponse : public IUlfResponse {
 public:
     /// `results` is not owned and must outlive this object.

@@ -96,6 +96,7 @@ void AddChecks(CFormView& form, CUlfItemDialog& item, QSize least)
     };
     b.set = [&item](std::size_t row, std::size_t, const std::string& text) {
         item.m_checks.at(row).checked = text == "1";
+        item.m_checks.at(row).times = 1;
         return 1;
     };
     b.mark = [&item, findings](std::size_t row, std::size_t) {
@@ -213,6 +214,16 @@ std::string SummaryText(const STAGE& item)
     return text;
 }
 
+/// A line for each warning.
+std::string WarningText(const STAGE& item)
+{
+    std::string text;
+    for (const T_FINDING& f : item.Warnings())
+        text +=
+            (text.empty() ? "" : "\n") + MMSGFunction::Format("IDS_QM_UI_ULF_WARNING", {f.text});
+    return text;
+}
+
 void AddRows(CFormView& form, STAGE& item)
 {
     const auto chosen = std::make_shared<int>(-1);
@@ -230,6 +241,7 @@ void AddRows(CFormView& form, STAGE& item)
                           },
                           [chosen] { return *chosen >= 0; }}});
     form.Note([&item] { return SummaryText(item); });
+    form.Note([&item] { return WarningText(item); });
     form.EndGroup();
 }
 

@@ -110,6 +110,27 @@ T_GRID_BINDING RowGrid(RUN& run)
     return b;
 }
 
+T_GRID_BINDING AnalysedGrid(RUN& run)
+{
+    T_GRID_BINDING b;
+    b.columns = UlfColumns(RUN::kAnalysedHeads, {kText, kNumber, kNumber, kNumber, kText});
+    b.rows = [&run] { return run.Analysed().size(); };
+    b.text = [&run](std::size_t row, std::size_t column) { return run.AnalysedText(row, column); };
+    b.tone = [&run](std::size_t row, std::size_t) {
+        return run.Analysed().at(row).Agrees() ? CELL_TONE::Plain : CELL_TONE::Fault;
+    };
+    return b;
+}
+
+T_GRID_BINDING StayGrid(RUN& run)
+{
+    T_GRID_BINDING b;
+    b.columns = UlfColumns(RUN::kStayHeads, {kNumber, kText, kNumber, kNumber, kNumber, kNumber});
+    b.rows = [&run] { return run.Stays().size(); };
+    b.text = [&run](std::size_t row, std::size_t column) { return run.StayText(row, column); };
+    return b;
+}
+
 T_PLOT PictureOf(const RUN& run)
 {
     const std::vector<std::string> names = run.ItemTexts();
@@ -149,8 +170,12 @@ void BuildRun(CFormView& form, RUN& run)
     AddUlfGrid(form, StepGrid(run), {380, 150});
     form.Note(KeyText("IDS_QM_UI_ULF_CHOSEN_ITERATION"));
     AddUlfGrid(form, RowGrid(run), {380, 150});
+    form.Note([&run] { return MMSGFunction::Format("IDS_QM_UI_ULF_STAYS", {run.ForceUnit()}); });
+    AddUlfGrid(form, StayGrid(run), {380, 110});
     form.NextColumn();
-    form.Picture([&run] { return PictureOf(run); }).widget->setMinimumSize(420, 400);
+    form.Note(KeyText("IDS_QM_UI_ULF_ANALYSED_BESIDE"));
+    AddUlfGrid(form, AnalysedGrid(run), {420, 110});
+    form.Picture([&run] { return PictureOf(run); }).widget->setMinimumSize(420, 300);
     form.EndColumns();
 }
 

@@ -158,7 +158,8 @@ T_ULF_PICTURE UlfPictureOf(const CUnknownLoadFactorResultDlg& dialog)
     for (std::size_t i = 0; i < r.cases.size(); ++i)
         picture.notes.push_back(MMSGFunction::Format(
             r.cases[i].unknown ? "IDS_QM_PLOT_FACTOR_IS" : "IDS_QM_PLOT_FACTOR_IS_KNOWN",
-            {r.cases[i].name, FormatText("%.6g", r.factors[i])}));
+            {r.cases[i].name, FormatText("%.6g", UlfShownFactor(r, i))}));
+    if (!dialog.Notice().empty()) picture.notes.push_back(dialog.Notice());
     return picture;
 }
 

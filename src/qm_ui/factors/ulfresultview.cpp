@@ -41,7 +41,7 @@ T_GRID_BINDING ConstraintGrid(const RESULT& result)
     return b;
 }
 
-void Export(CFormView& form, RESULT& result, const T_ULF_HOOKS& hooks)
+void Export(CFormView& form, RESULT& result, const T_ULF_HOOKS& hooks, bool opens)
 {
     const QString path = hooks.askSheetName(form.window());
     if (path.isEmpty()) return;
@@ -49,7 +49,7 @@ void Export(CFormView& form, RESULT& result, const T_ULF_HOOKS& hooks)
     result.m_sheet.year = today.year();
     result.m_sheet.month = today.month();
     result.m_sheet.day = today.day();
-    (void)result.OnExport(path.toStdString());
+    (void)(opens ? result.OnOpenSheet(path.toStdString()) : result.OnExport(path.toStdString()));
 }
 
 void AddExport(CFormView& form, RESULT& result, const T_ULF_HOOKS& hooks)
@@ -63,7 +63,9 @@ void AddExport(CFormView& form, RESULT& result, const T_ULF_HOOKS& hooks)
                  }},
                 KeyTexts({"IDS_QM_UI_ULF_SHEET_NEW", "IDS_QM_UI_ULF_SHEET_OLD"}));
     AddUlfButtons(form, {{"IDS_QM_UI_ULF_SHEET_WRITE",
-                          [&form, &result, hooks] { Export(form, result, hooks); }}});
+                          [&form, &result, hooks] { Export(form, result, hooks, false); }},
+                         {"IDS_QM_UI_ULF_SHEET_OPEN",
+                          [&form, &result, hooks] { Export(form, result, hooks, true); }}});
     form.EndGroup();
 }
 
@@ -85,6 +87,7 @@ void BuildResult(CFormView& form, RESULT& result, const T_ULF_HOOKS& hooks)
     form.NextColumn();
     AddUlfGrid(form, ConstraintGrid(result), {760, 300});
     form.EndColumns();
+    form.Note([&result] { return result.Notice(); });
     form.Page(KeyText("IDS_QM_UI_ULF_PICTURE"));
     AddUlfPicture(form, [&result] { return UlfPlot(UlfPictureOf(result)); });
     form.EndPages();

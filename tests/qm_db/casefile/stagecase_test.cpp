@@ -31,7 +31,7 @@ TEST(StageCase, ReadsEveryMemberIntoItsField)
     const std::vector<T_ULSI_ROW> rows{{5, 2, 3, true, 1.0, 2.0, true, 2},
                                        {1, 1, 1, true, 1.0, 1.0, false, 0},
                                        {2, -1, 2, false, 1.5, 1.0, false, 1}};
-    EXPECT_EQ((T_ULSI_D{"tune", rows, 1, 2, true, {"tip"}}), m.ulfStageItems.at(1));
+    EXPECT_EQ((T_ULSI_D{"tune", rows, 1, 2, true, {"tip"}, true}), m.ulfStageItems.at(1));
 }
 
 TEST(StageCase, CaseFileAndModelFileGiveTheSameModelBack)

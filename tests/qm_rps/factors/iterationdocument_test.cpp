@@ -45,7 +45,7 @@ TEST_F(UlfIterationDocument, LeavesTheLoadsWhenOneOfThemCannotBeChanged)
     content.model.loadCases[2].pretension.push_back({9, 1.0}); // there is no such element
     CDBDoc doc;
     doc.Data().Assign(std::move(content));
-    CUlfIterationDocHost host(doc, doc.Data().Model().ulfStageItems.at(1), false);
+    CUlfIterationDocHost host(doc, doc.Data().Model().ulfStageItems.at(1));
     std::vector<T_ULF_ITER_ROW> rows;
     std::optional<T_FINDING> said;
     EXPECT_EQ(0, host.Solve(rows, said)); // forms the problem; without results there are no factors
@@ -61,7 +61,7 @@ TEST_F(UlfIterationDocument, BringsATwoTrussFrameToItsTensionInOneIteration)
 {
     CDBDoc doc;
     Open(doc);
-    CUlfIterationDocHost host(doc, doc.Data().Model().ulfStageItems.at(1), false);
+    CUlfIterationDocHost host(doc, doc.Data().Model().ulfStageItems.at(1));
     CUlfIteration run(host, m_person, {});
     ASSERT_EQ(1, run.Run()) << host.Error();
     EXPECT_EQ(ULF_ITER_END::Converged, run.End());
@@ -91,7 +91,7 @@ TEST_F(UlfIterationDocument, LeavesTheDocumentAsAfterTheLastIterationWhenAnAnaly
     for (const bool cancel : {true, false}) {
         CDBDoc doc;
         Open(doc);
-        CUlfIterationDocHost host(doc, doc.Data().Model().ulfStageItems.at(1), false);
+        CUlfIterationDocHost host(doc, doc.Data().Model().ulfStageItems.at(1));
         CUlfIteration run(host, m_person, {});
         m_person.m_overwrite = true;
         double whileRunning = 0.0;

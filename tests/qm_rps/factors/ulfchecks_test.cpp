@@ -6,6 +6,7 @@
 #include "qm_rps/factors/checks/ulfcombinationchecks.h"
 #include "qm_rps/factors/checks/ulfconstraintchecks.h"
 #include "qm_rps/factors/checks/ulfitemchecks.h"
+#include "qm_rps/factors/checks/ulfstagechecks.h"
 
 #include <algorithm>
 #include <cmath>
@@ -125,6 +126,8 @@ TEST(UlfChecks, StaticItemsAreJudgedRuleByRule)
         {"IDS_QM_ULFI_NO_SUCH_CONSTRAINT", "constraints",
          [](M&, I& i) { i.constraints[0] = "gone"; }},
         {"IDS_QM_ULFI_TWICE", "constraints", [](M&, I& i) { i.constraints.push_back("D2"); }},
+        {"IDS_QM_ULFI_STAGE_CONSTRAINT", "constraints",
+         [](M& m, I&) { m.ulfConstraints[1].stage = 1; }},
         {"IDS_RPS_the_Node_Id_doesn_t_exist", "constraints[D3].id",
          [](M& m, I&) { m.nodes.erase(3); }},
     };
@@ -170,11 +173,21 @@ TEST(UlfChecks, StageItemsAreJudgedRuleByRuleAndRowByRow)
          [](M&, I& i) { i.rows.push_back(i.rows[1]); i.rows[2].step = kStageLastStep; }},
         {"IDS_QM_ULSI_NO_PRETENSION", "rows[1].pretension", "row 1 ",
          [](M&, I& i) { i.rows.pop_back(); i.rows[0].loadCase = 1; }},
-        {"IDS_QM_ULSI_SCALED_TWICE", "rows[3].pretension", "row 3 (S1/First Step G): ",
-         [](M& m, I& i) {
+        {"IDS_QM_ULSI_SCALED_TWICE", "rows[2].pretension", "row 2 (S1/First Step G): ",
+         [](M&, I& i) { i.rows[1] = {1, 1, 1, true, 1, 1, true, 0}; }},
+        {"IDS_QM_ULSI_NOT_IN_SUM", "rows[1].load_group", "row 1 (S1/First Step T): ",
+         [](M&, I& i) { i.rows[0].loadGroup = kLoadGroupErection; }},
+        {"IDS_QM_ULSI_COUNTED_TWICE", "rows[3].load_group", "row 3 (S1/First Step G): ",
+         [](M& m, I& i) { // two rows that read the dead load
              m.loadCases[3] = m.loadCases[1];
-             i.rows.push_back({1, 1, 3, true, 1, 1, true, 0});
+             i.rows.push_back({1, 1, 3, false, 1, 1, false, kLoadGroupErection});
          }},
+        {"IDS_QM_ULSI_COUNTED_TWICE", "rows[1].load_group", "row 1 ",
+         [](M& m, I&) { m.loadCases[2].group = kLoadGroupDead; }},
+        {"IDS_QM_ULSI_COUNTED_TWICE", "rows[1].load_group", "row 1 ",
+         [](M&, I& i) { i.sumStageLoads = true; }},
+        {"", "", "", [](M&, I& i) { i.sumStageLoads = true; i.rows[0].pretension = false; }},
+        {"", "", "", [](M&, I& i) { i.rows[1].loadGroup = kLoadGroupErection; }},
         {"IDS_QM_ULFI_SIGN", "sign", "", [](M&, I& i) { i.sign = 3; }},
         {"IDS_RPS_No_Unknown_Load_Factor_defined_", "rows", "",
          [](M&, I& i) { i.rows.erase(i.rows.begin()); }},
@@ -182,8 +195,31 @@ TEST(UlfChecks, StageItemsAreJudgedRuleByRuleAndRowByRow)
          [](M&, I& i) { i.constraints.clear(); }},
         {"IDS_QM_ULFI_NO_SUCH_CONSTRAINT", "constraints", "",
          [](M&, I& i) { i.constraints = {"GONE"}; }},
-        {"IDS_QM_ULSI_CONSTRAINT_PLACE", "constraints", "",
+        {"IDS_QM_ULSI_CONSTRAINT_PLACE", "constraints[HOLD].stage", "constraint HOLD: ",
          [](M& m, I&) { m.ulfConstraints[1].stage = 9; }},
+        {"IDS_QM_ULSI_NO_PLACE", "constraints[HOLD].stage", "",
+         [](M& m, I& i) { m.stages[2] = {"S2", {}, {}}; i.rows[1].stage = 2; }},
+        {"", "", "", // read at the end of the second stage, whatever the rows' places
+         [](M& m, I& i) {
+             m.stages[2] = {"S2", {}, {}};
+             i.rows[1].stage = m.ulfConstraints[1].stage = 2;
+         }},
+        {"IDS_QM_ULSI_NOT_STANDING", "constraints[HOLD].id", "", // gone at the second stage
+         [](M& m, I&) {
+             m.stages[2] = {"S2", {}, {{1, 2}, {}, {}}};
+             m.ulfConstraints[1].stage = 2;
+         }},
+        {"IDS_QM_ULSI_NOT_STANDING", "constraints[HOLD].id", "", // no support
+         [](M& m, I&) {
+             m.ulfConstraints[1].type = ULFC_TYPE::Reaction;
+             m.stages[1].activate.supports = {1, 3};
+         }},
+        {"IDS_QM_ULSI_NOT_STANDING", "constraints[HOLD].otherId", "",
+         [](M& m, I&) {
+             m.ulfConstraints[1].compareWithValue = false;
+             m.ulfConstraints[1].otherId = 3;
+             m.stages[1].activate.elements = {1};
+         }},
         {"IDS_RPS_the_Node_Id_doesn_t_exist", "constraints[HOLD].id", "",
          [](M& m, I&) { m.ulfConstraints[1].id = 9; }},
     };
@@ -200,6 +236,43 @@ TEST(UlfChecks, StageItemsAreJudgedRuleByRuleAndRowByRow)
         if (*row.says) {
             EXPECT_NE(std::string::npos, found.at(0).text.find(row.says)) << found[0].text;
         }
+    }
+}
+
+TEST(UlfChecks, StageItemsWarnOfWhatTheAnalysisDoesNotTakeAsTheyDo)
+{
+    const struct {
+        std::vector<std::string> rules;
+        const char* says;
+        void (*spoil)(T_MODEL&, T_ULSI_D&);
+    } cases[] = {
+        {{}, "", [](T_MODEL&, T_ULSI_D&) {}},
+        {{"IDS_QM_ULSI_NEVER_APPLIED"},
+         "row 1 (S1/First Step T)",
+         [](T_MODEL&, T_ULSI_D& i) { i.rows[0].pretension = false; }},
+        {{"IDS_QM_ULSI_KNOWN_FACTOR"},
+         "row 2 (S1/First Step G)",
+         [](T_MODEL&, T_ULSI_D& i) { i.rows[1].factor = 1.35; }},
+        {{"IDS_QM_ULSI_FORGOTTEN"}, "G", [](T_MODEL&, T_ULSI_D& i) { i.rows.pop_back(); }},
+        {{},
+         "",
+         [](T_MODEL& m, T_ULSI_D&) { // it comes after the constraint is read
+             m.loadCases[3].name = "Q";
+             m.stages[2] = {"S2", {{}, {}, {{3, kStageFirstStep}}}, {}};
+         }},
+    };
+    for (const auto& row : cases) {
+        T_MODEL_CONTENT content = two::Content();
+        T_ULSI_D item = content.model.ulfStageItems[1];
+        row.spoil(content.model, item);
+        CDBDoc doc;
+        doc.Data().Assign(std::move(content));
+        std::vector<std::string> rules;
+        for (const T_FINDING& f : UlfStageItemWarnings(item, doc.Data())) {
+            rules.push_back(f.ruleText);
+            EXPECT_NE(std::string::npos, f.text.find(row.says)) << f.text;
+        }
+        EXPECT_EQ(row.rules, rules);
     }
 }
 

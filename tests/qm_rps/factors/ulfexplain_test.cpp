@@ -78,10 +78,19 @@ TEST(UlfExplain, GivesWhatRelaxingALimitBuys)
          -2,
          4,
          1,
-         "C (>= -2 m) holds the solution. Lowering the limit by 1 m changes the objective by -1."},
-        {-14, {}, LIMIT::Upper, -14, 1, -0.5, "C (<= -14 m) holds the solution. Raising the"},
+         "At first, raising the limit by 1 % (0.02 m) changes the objective by +0.02, lowering it "
+         "by "
+         "-0.02."},
+        {-14,
+         {},
+         LIMIT::Upper,
+         -14,
+         1,
+         -0.5,
+         "C (<= -14 m) holds the solution. At first, raising the"},
         {50, -2, LIMIT::Lower, -2, 4, 1, "C (>= -2 m)"},
-        {6, 6, LIMIT::Target, 6, 16, 2, "C (= 6 m) holds the solution. Raising the limit by 1 m"},
+        {6, 6, LIMIT::Target, 6, 16, 2,
+         "(0.06 m) changes the objective by +0.12, lowering it by -0.12."},
     };
     for (const auto& c : kCases) {
         SCOPED_TRACE(c.words);

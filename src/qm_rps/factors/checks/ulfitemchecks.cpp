@@ -3,9 +3,11 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/ruletable.h"
 #include "qm_rps/factors/checks/ulfconstraintchecks.h"
+#include "qm_rps/factors/checks/ulfstagechecks.h"
 #include "qm_rps/factors/ulfcombination.h"
 #include "qm_rps/factors/ulfstageplace.h"
 #include "qm_rps/factors/ulfstageproblem.h"
+#include "qm_rps/factors/ulfstanding.h"
 
 #include <algorithm>
 #include <cmath>
@@ -149,6 +151,14 @@ bool UnknownsDiffer(const T_ITEM_CHECK& c)
 {
     return AllDiffer(c.item.unknowns, &T_ULFI_UNKNOWN::loadCase);
 }
+/// The constraints that are there have no stage.
+bool ConstraintsAreStatic(const T_ITEM_CHECK& c)
+{
+    return std::ranges::none_of(c.item.constraints, [&](const std::string& name) {
+        const int key = FindUlfConstraint(c.model, name);
+        return key != 0 && c.model.ulfConstraints.at(key).stage != 0;
+    });
+}
 bool WeightsAreNumbers(const T_ITEM_CHECK& c)
 {
     return std::ranges::all_of(c.item.unknowns, [](const T_ULFI_UNKNOWN& unknown) {
@@ -168,6 +178,9 @@ constexpr T_RULE<T_ITEM_CHECK> kUnknownRules[] = {
     {Wrong("IDS_QM_ULFI_TWICE",  "unknowns"), UnknownsDiffer},
     {Wrong("IDS_QM_ULFI_WEIGHT", "unknowns"), WeightsAreNumbers},
 };
+constexpr T_RULE<T_ITEM_CHECK> kStaticPlaceRules[] = {
+    {Wrong("IDS_QM_ULFI_STAGE_CONSTRAINT", "constraints"), ConstraintsAreStatic},
+};
 // clang-format on
 
 // ---- items of construction stages ---------------------------------------------------------------
@@ -175,8 +188,10 @@ constexpr T_RULE<T_ITEM_CHECK> kUnknownRules[] = {
 struct T_ROW_CHECK {
     const T_ULSI_ROW& row;
     const T_MODEL& model;
-    bool twice = false;  // a row before it is the same load at the same stage and step
-    bool shared = false; // a row before it scales some of its pretension loads
+    bool twice = false;   // a row before it is the same load at the same stage and step
+    bool shared = false;  // a row before it scales some of its pretension loads
+    bool inSum = true;    // its load is part of what it reads
+    bool counted = false; // another row reads it too
 };
 
 bool PlaceExists(const T_ROW_CHECK& c)
@@ -212,6 +227,14 @@ bool PretensionIsThere(const T_ROW_CHECK& c)
            std::ranges::any_of(LoadsScaledBy(c.model, c.row),
                                [&](int load) { return HasPretension(c.model, load); });
 }
+bool LoadIsRead(const T_ROW_CHECK& c)
+{
+    return c.inSum;
+}
+bool CountsOnce(const T_ROW_CHECK& c)
+{
+    return !c.counted;
+}
 /// Scaled by two unknowns, a load would get both factors.
 bool ScalesAlone(const T_ROW_CHECK& c)
 {
@@ -227,17 +250,6 @@ bool HasUnknownRow(const T_STAGE_CHECK& c)
 {
     return std::ranges::any_of(c.item.rows, &T_ULSI_ROW::unknown);
 }
-bool ConstraintPlacesExist(const T_STAGE_CHECK& c)
-{
-    return std::ranges::all_of(c.item.constraints, [&](const std::string& name) {
-        const int key = FindUlfConstraint(c.model, name);
-        if (key == 0) return true; // a missing one has its own rule
-        const T_ULFC_D& constraint = c.model.ulfConstraints.at(key);
-        return constraint.stage == 0 ||
-               UlfStepNumber(c.model, constraint.stage, constraint.step) != 0;
-    });
-}
-
 // clang-format off
 constexpr T_RULE<T_ROW_CHECK> kRowRules[] = {
     {Wrong("IDS_QM_ULSI_PLACE",         "step"),       PlaceExists},
@@ -245,14 +257,13 @@ constexpr T_RULE<T_ROW_CHECK> kRowRules[] = {
     {Wrong("IDS_QM_ULSI_GROUP",         "load_group"), KnownGroup},
     {Wrong("IDS_QM_ULSI_NUMBER",        "factor"),     NumbersAreFinite},
     {Wrong("IDS_QM_ULSI_TWICE",         "case"),       StandsOnce},
+    {Wrong("IDS_QM_ULSI_NOT_IN_SUM",    "load_group"), LoadIsRead},
+    {Wrong("IDS_QM_ULSI_COUNTED_TWICE", "load_group"), CountsOnce, LoadIsRead},
     {Wrong("IDS_QM_ULSI_NO_PRETENSION", "pretension"), PretensionIsThere},
     {Wrong("IDS_QM_ULSI_SCALED_TWICE",  "pretension"), ScalesAlone},
 };
 constexpr T_RULE<T_STAGE_CHECK> kStageUnknownRules[] = {
     {Says("IDS_RPS_No_Unknown_Load_Factor_defined_", "rows"), HasUnknownRow},
-};
-constexpr T_RULE<T_STAGE_CHECK> kStagePlaceRules[] = {
-    {Wrong("IDS_QM_ULSI_CONSTRAINT_PLACE", "constraints"), ConstraintPlacesExist},
 };
 // clang-format on
 
@@ -270,6 +281,9 @@ void CheckRows(const T_ULSI_D& item, const CDataCtrl& data, std::vector<T_FINDIN
         check.twice = step && !places.insert({row.stage, step, row.loadCase}).second;
         for (const int load : LoadsScaledBy(model, row))
             if (HasPretension(model, load)) check.shared |= !scaled.insert(load).second;
+        check.inSum = !model.loadCases.contains(row.loadCase) || // a missing one has its own rule
+                      ReadsCase(model, item, row, row.loadCase);
+        check.counted = RowThatCounts(item, i, model) != 0;
         const std::string number = std::to_string(i + 1);
         std::vector<T_FINDING> found;
         WalkRules(kRowRules, check, {.prefix = "rows[" + number + "]."}, found);
@@ -299,6 +313,7 @@ std::vector<T_FINDING> CheckUlfItem(const T_ULFI_D& item, int ownKey, const CDat
     WalkRules(kWayRules, common, place, out);
     WalkRules(kUnknownRules, own, place, out);
     WalkRules(kConstraintRules, common, place, out);
+    WalkRules(kStaticPlaceRules, own, place, out);
     AddConstraintFindings(item.constraints, model, out);
     return out;
 }
@@ -315,7 +330,8 @@ std::vector<T_FINDING> CheckUlfStageItem(const T_ULSI_D& item, int ownKey, const
     WalkRules(kWayRules, common, place, out);
     WalkRules(kStageUnknownRules, {item, model}, place, out);
     WalkRules(kConstraintRules, common, place, out);
-    WalkRules(kStagePlaceRules, {item, model}, place, out);
     AddConstraintFindings(item.constraints, model, out);
+    for (T_FINDING& f : CheckUlfConstraintPlaces(item, model))
+        out.push_back(std::move(f));
     return out;
 }
