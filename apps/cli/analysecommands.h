@@ -20,6 +20,9 @@ struct T_ANALYSE_OPTIONS {
     std::string plotCase;           // its load case or combination; empty: the first one shown
     int plotMode = 0;               // a mode in place of a load case
     std::string out;                // write the model with its results here
+    std::string nodes, elements;    // "1,5-9": shown alone; empty: all
+    int top = 0;                    // of each table the rows with the largest values; 0: all
+    bool envelope = false;          // over the load cases in place of their tables
     bool overwrite = false;         // files that are there
     bool noStore = false;           // don't store the results in a model file
 };

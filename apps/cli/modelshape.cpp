@@ -1,6 +1,6 @@
 #include "modelshape.h"
 
-#include "analysistext.h"
+#include "analysis/analysistext.h"
 
 #include <algorithm>
 #include <map>

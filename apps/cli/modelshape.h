@@ -1,7 +1,7 @@
 // A document's frame and its displacements as the picture of moved frames takes them.
 #pragma once
 
-#include "analysisresults.h"
+#include "analysis/analysisresults.h"
 #include "qm_ui/frame/shapeplot.h"
 
 /// Nodes and members; no state yet.

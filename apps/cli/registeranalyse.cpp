@@ -18,6 +18,10 @@ void AddAnalyse(CLI::App& app, EXIT_CODE& code)
     sub->add_option("--load", o->load, Say("IDS_QM_HELP_ANALYSE_LOAD"));
     AddJson(sub, o->json);
     sub->add_flag("--table", o->table, Say("IDS_QM_HELP_ANALYSE_TABLE"));
+    sub->add_option("--node", o->nodes, Say("IDS_QM_HELP_ANALYSE_NODE"));
+    sub->add_option("--element", o->elements, Say("IDS_QM_HELP_ANALYSE_ELEMENT"));
+    sub->add_option("--top", o->top, Say("IDS_QM_HELP_ANALYSE_TOP"))->check(CLI::Range(1, 1000000));
+    sub->add_flag("--envelope", o->envelope, Say("IDS_QM_HELP_ANALYSE_ENVELOPE"));
     sub->add_option("--plot", o->plot, Say("IDS_QM_HELP_ANALYSE_PLOT"));
     auto* plotCase =
         sub->add_option("--plot-case", o->plotCase, Say("IDS_QM_HELP_ANALYSE_PLOT_CASE"));

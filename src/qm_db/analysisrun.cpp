@@ -30,6 +30,12 @@ struct T_RUN {
     solver::CFrameSolver engine;
     std::vector<int> cases;
     std::size_t total = 0; // parts of the run: cases and modes
+    std::vector<T_LOST_DIGITS> lost;
+
+    void Note(int loadCase, const solver::T_ACCURACY& known)
+    {
+        if (known.unrefined > 0.0) lost.push_back({loadCase, known.unrefined, known.error});
+    }
 
     int Fail(const solver::T_SOLVER_ERROR& fault, std::span<const int> keys,
              T_ANALYSIS_ERROR& error) const
@@ -55,6 +61,7 @@ int SolveBatch(T_RUN& run, std::size_t first, std::uint64_t structure,
     for (std::size_t i = 0; i < keys.size(); ++i) {
         const std::uint64_t print = FingerprintOfCase(structure, run.model.loadCases.at(keys[i]));
         out.push_back(MakeStaticResult(run.frame.ResultOf(results[i], print)));
+        run.Note(keys[i], results[i].accuracy);
         results[i] = {};
     }
     return 1;
@@ -111,7 +118,7 @@ int CAnalysisRun::Compute(const T_MODEL& model, const T_ANALYSIS_OPTIONS& option
                           const std::shared_ptr<IStagedResult>& before, T_ANALYSIS_RESULTS& out,
                           T_ANALYSIS_ERROR& error)
 {
-    T_RUN run{model, options, CAnalysisModel(model), {}, options.cases, 0};
+    T_RUN run{model, options, CAnalysisModel(model), {}, options.cases, 0, {}};
     if (options.allCases) {
         run.cases.clear();
         for (const auto& entry : model.loadCases)
@@ -131,6 +138,8 @@ int CAnalysisRun::Compute(const T_MODEL& model, const T_ANALYSIS_OPTIONS& option
     if (options.modes > 0 && !FindModes(run, found.modes.emplace(), error)) return 0;
     if (hasStages && !staged.Run(Part(options, parts, run.total), before, found.staged, error))
         return 0;
+    run.Note(0, staged.Accuracy());
+    found.lost = std::move(run.lost);
     for (std::size_t i = 0; i < results.size(); ++i)
         found.cases[run.cases[i]] = std::move(results[i]);
     out = std::move(found);

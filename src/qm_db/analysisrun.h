@@ -11,6 +11,7 @@ struct T_ANALYSIS_RESULTS {
     T_STATIC_MAP cases;                         // of the load cases that were asked for
     std::optional<std::vector<T_EIGV_D>> modes; // where they were asked for
     std::shared_ptr<IStagedResult> staged;      // likewise, where the model has stages
+    std::vector<T_LOST_DIGITS> lost;
 };
 
 /// Feeds a model to the analysis engine, and keeps the results in a document: of each load case

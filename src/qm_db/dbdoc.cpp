@@ -1,6 +1,7 @@
 #include "qm_db/dbdoc.h"
 
 #include "qm_base/say.h"
+#include "qm_base/textformat.h"
 #include "qm_db/casefile.h"
 #include "qm_db/filectrl.h"
 
@@ -199,6 +200,7 @@ void CDBDoc::EndAnalysis()
     m_data.SetLocked(false);
     T_ANALYSIS_RESULTS results;
     const int done = worker->Finish(results, m_outcome);
+    m_lost = results.lost;
     if (worker->IsCancelled())
         m_outcome = Failure(ANALYSIS_FAULT::Cancelled, Say("IDS_QM_ENGINE_CANCELLED"));
     else if (done && m_data.Revision() != m_revisionAtStart)
@@ -223,6 +225,15 @@ int CDBDoc::AnalysisOutcome(T_ANALYSIS_ERROR& error) const
 {
     error = m_outcome;
     return error.fault == ANALYSIS_FAULT::None ? 1 : 0;
+}
+
+std::string CDBDoc::TextOf(const T_LOST_DIGITS& lost) const
+{
+    const auto at = m_data.Model().loadCases.find(lost.loadCase);
+    const std::string where =
+        at == m_data.Model().loadCases.end() ? Say("IDS_QM_ANALYSIS_STAGES_ALL") : at->second.name;
+    return Say("IDS_QM_ANALYSIS_REFINED", where, FormatText("%.0e", lost.unrefined),
+               FormatText("%.0e", lost.error));
 }
 
 int CDBDoc::RunAnalysis(const T_ANALYSIS_OPTIONS& options, T_ANALYSIS_ERROR& error)

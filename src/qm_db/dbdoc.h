@@ -75,6 +75,10 @@ public:
     /// How the latest run has ended. 1 its results are in the document; 0 error says why not, and
     /// neither results nor modes have changed. Also 0 when the model was changed in spite of all.
     [[nodiscard]] int AnalysisOutcome(T_ANALYSIS_ERROR& error) const;
+    /// The load cases of the latest run that had lost digits, in the order of the run.
+    const std::vector<T_LOST_DIGITS>& LostDigits() const { return m_lost; }
+    /// One line that says of a case how much it had lost and what is left.
+    std::string TextOf(const T_LOST_DIGITS& lost) const;
     /// Starts a run and waits for its end, progress being told meanwhile. Outcome as above; 0 also
     /// while another run is under way. What the progress throws cancels the run.
     [[nodiscard]] int RunAnalysis(const T_ANALYSIS_OPTIONS& options, T_ANALYSIS_ERROR& error);
@@ -112,4 +116,5 @@ private:
     long m_revisionAtStart = 0;
     bool m_isTelling = false; // the progress
     T_ANALYSIS_ERROR m_outcome;
+    std::vector<T_LOST_DIGITS> m_lost;
 };

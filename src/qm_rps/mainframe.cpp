@@ -245,6 +245,8 @@ int CMainFrame::OnAnalyse(int modes, std::function<bool(std::size_t, std::size_t
         if (error.fault == ANALYSIS_FAULT::Cancelled) return 0;
         return Refuse(error.text);
     }
+    for (const T_LOST_DIGITS& lost : m_doc.LostDigits())
+        GSaveHistoryFormatNF("%s", m_doc.TextOf(lost).c_str());
     Note("IDS_QM_UI_ANALYSED", NameOfFile(m_doc.Path()));
     return 1;
 }

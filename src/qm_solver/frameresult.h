@@ -12,6 +12,12 @@ namespace solver {
 /// Positions of beam forces: I-end, 1/4, 2/4, 3/4, J-end of the flexible length.
 inline constexpr std::size_t kBeamPositions = 5;
 
+/// Relative error of a load case, estimated by iterative refinement; 0 where none was needed.
+struct T_ACCURACY {
+    double unrefined = 0.0; // of the displacements of the direct solution
+    double error = 0.0;     // of the result: of displacements or of equilibrium, the larger
+};
+
 /// Results of one load case, all arrays by the model's indices.
 ///
 /// Signs of beam forces. They act on the face whose outward normal is local x (towards J), that of
@@ -37,6 +43,7 @@ struct T_RESULT {
     /// at all positions for loads at its nodes. Link: stiffness times (displacement of j minus
     /// that of i), global axes, the same at all positions. Spring: 0.
     std::vector<std::array<T_VEC6, kBeamPositions>> force;
+    T_ACCURACY accuracy;
 };
 inline auto Numbers(const T_RESULT& r)
 {

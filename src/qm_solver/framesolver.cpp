@@ -61,19 +61,15 @@ std::optional<T_SOLVER_ERROR> CFrameSolver::T_STATE::SolveBlock(std::span<const 
                                                                 std::vector<T_RESULT>& out)
 {
     const CCaseBlock block(frame, dofs, cases);
-    const std::vector<double> loads = block.RightSides();
-    std::vector<double> x = loads;
+    T_SOLUTION solution;
     T_SOLVER_REASON reason;
-    const std::size_t n = dofs.EquationCount();
-    if (n > 0 && !factor.Solve(x, cases.size(), reason)) return Failed(reason);
-    for (std::size_t c = 0; c < cases.size(); ++c)
-        if (!InBalance(assembly.Matrix(), dofs, extent, std::span(loads).subspan(c * n, n),
-                       std::span(x).subspan(c * n, n))) {
-            T_SOLVER_ERROR error = Failed(kOutOfBalance);
-            error.loadCase = static_cast<long>(first + c);
-            return error;
-        }
-    block.Recover(x, out);
+    std::size_t at = 0;
+    if (!SolveBalanced(block, dofs, extent, assembly.Matrix(), factor, solution, at, reason)) {
+        T_SOLVER_ERROR error = Failed(reason);
+        error.loadCase = at < cases.size() ? static_cast<long>(first + at) : -1;
+        return error;
+    }
+    block.Recover(solution, out);
     for (std::size_t c = 0; c < cases.size(); ++c)
         if (!IsFinite(out[first + c])) {
             T_SOLVER_ERROR error = Failed("IDS_QM_ENGINE_OVERFLOW");

@@ -14,6 +14,7 @@ struct T_STAGED_COST {
     std::size_t analyses = 0;       // symbolic, one for each active part that differs
     std::size_t factorisations = 0; // numeric
     std::size_t iterations = 0;     // the most that a step took; 1 without second order
+    T_ACCURACY accuracy;            // of the displacements that are known worst
 };
 
 /// Forward analysis in total form. In each step, for each load case c on its own,

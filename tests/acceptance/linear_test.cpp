@@ -132,6 +132,39 @@ TEST_F(Linear, TablesHaveUnitsAndColumnsThatStandApart)
         << "nodes and supports";
 }
 
+TEST_F(Linear, ShowsWhatIsChosenAndTheEnvelopeOfTheCases)
+{
+    const std::string file = "analyse @cable-stayed-bridge --case DEAD --case SERVICE --case WIND";
+    const json all = Json(file).at("displacements");
+    const json some = Json(file + " --node 3,5-6").at("displacements").at("DEAD");
+    EXPECT_EQ((json{{"3", all.at("DEAD").at("3")},
+                    {"5", all.at("DEAD").at("5")},
+                    {"6", all.at("DEAD").at("6")}}),
+              some);
+    std::map<double, std::string> byValue; // DZ of node 5
+    for (const auto& [name, nodes] : all.items())
+        byValue[nodes.at("5").at(2)] = name;
+    const std::vector<std::string> lines = Lines(Done(file + " --envelope --node 5"));
+    const auto row = std::ranges::find_if(lines, [](const std::string& line) {
+        return std::regex_search(line, std::regex(R"(^ +5  DZ )"));
+    });
+    ASSERT_NE(lines.end(), row);
+    std::istringstream cells(*row);
+    std::string id, component, unit, at, atMax;
+    double min = 0.0, max = 0.0;
+    cells >> id >> component >> unit >> min >> at >> max >> atMax;
+    EXPECT_NEAR(byValue.begin()->first, min, 1e-5 * std::fabs(min));
+    EXPECT_NEAR(byValue.rbegin()->first, max, 1e-5 * std::fabs(max));
+    EXPECT_EQ(byValue.begin()->second + " " + byValue.rbegin()->second, at + " " + atMax);
+
+    // The beam of the largest bending moment stands alone, and is the one that the summary names.
+    const std::string top = Done("analyse @cable-stayed-bridge --case DEAD --top 1");
+    EXPECT_EQ(1, std::ranges::count_if(Lines(top), [](const std::string& line) {
+                  return std::regex_search(line, std::regex(R"(^ *\d+   I )"));
+              }));
+    ExpectRefused("analyse @cable-stayed-bridge --node 999", 2, "999");
+}
+
 TEST_F(Linear, AModelFileKeepsItsResultsUnlessToldNotTo)
 {
     Done("import @tuned-beam m.qmdb");

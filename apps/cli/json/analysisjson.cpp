@@ -79,7 +79,8 @@ void Write(CJsonText& w, const T_SHOWN_STAGE& s)
 std::string AnalysisJson(const std::vector<T_SHOWN_CASE>& shown,
                          const std::vector<T_CASE_RESULTS>& results,
                          const std::vector<T_MODE_RESULTS>& modes,
-                         const std::vector<T_SHOWN_STAGE>& stages)
+                         const std::vector<T_SHOWN_STAGE>& stages,
+                         const T_ACCURACY_BY_NAME& accuracy)
 {
     CJsonText w(JSON_REALS::Shortest);
     w.Object(kTop);
@@ -91,6 +92,14 @@ std::string AnalysisJson(const std::vector<T_SHOWN_CASE>& shown,
     for (const T_MODE_RESULTS& mode : modes)
         Write(w, mode);
     w.End();
+    if (!accuracy.empty()) w.Key("accuracy").Object(kCases);
+    for (const auto& [name, lost] : accuracy) {
+        w.Key(name).Object({2, 2});
+        w.Member("unrefined", lost.unrefined);
+        w.Beside().Member("error", lost.error);
+        w.End();
+    }
+    if (!accuracy.empty()) w.End();
     if (!stages.empty()) w.Key("stages").Object(kCases);
     for (const T_SHOWN_STAGE& stage : stages)
         Write(w.Key(stage.stage), stage);

@@ -15,6 +15,12 @@ struct T_ANALYSIS_OPTIONS {
     bool stages = true; // construction stages, where the model has any
 };
 
+/// A load case whose direct solution kept less than eight digits, so that it was refined.
+struct T_LOST_DIGITS {
+    int loadCase = 0;                    // key; 0: construction stages, the worst of all solutions
+    double unrefined = 0.0, error = 0.0; // estimated relative error before and after
+};
+
 enum class ANALYSIS_FAULT {
     None,
     BadModel,     // something is missing or wrong: element, node or load case named

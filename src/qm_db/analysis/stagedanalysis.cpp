@@ -242,6 +242,7 @@ int CStagedAnalysis::Run(const solver::ProgressFn& progress,
     else if (!engine.Prepare(m_staged, fault))
         return Fail(fault, error);
     if (!engine.Run(m_loads, fault, progress)) return Fail(fault, error);
+    m_accuracy = engine.Cost().accuracy;
     std::vector<int> groups;
     for (const int key : m_cases)
         groups.push_back(m_model.loadCases.at(key).group);

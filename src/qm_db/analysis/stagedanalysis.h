@@ -21,6 +21,9 @@ public:
                           const std::shared_ptr<IStagedResult>& before,
                           std::shared_ptr<IStagedResult>& out, T_ANALYSIS_ERROR& error);
 
+    /// Of the displacements that are known worst, after Run; 0 where all kept their digits.
+    const solver::T_ACCURACY& Accuracy() const { return m_accuracy; }
+
 private:
     int Build(T_ANALYSIS_ERROR& error);
     int AddStage(int key, const T_STAG_D& stage, T_ANALYSIS_ERROR& error);
@@ -39,4 +42,5 @@ private:
     std::vector<int> m_stages, m_cases; // keys by index
     solver::T_STAGED_MODEL m_staged;
     std::vector<solver::T_LOAD_CASE> m_loads;
+    solver::T_ACCURACY m_accuracy;
 };

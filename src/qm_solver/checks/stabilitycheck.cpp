@@ -131,8 +131,25 @@ void AddDifference(const T_FRAME& frame, std::size_t i, std::size_t j, const T_D
     }
 }
 
-void AddSprings(const T_FRAME& frame, const TiedDirections& tied, CParts& parts,
-                std::vector<T_PART*>& partOf)
+/// In a diaphragm, nodes of other heights along the normal resist turning out of its plane.
+void AddDiaphragm(const T_FRAME& frame, const T_DIAPHRAGM& diaphragm, T_PART& part)
+{
+    const auto normal = static_cast<Eigen::Index>(diaphragm.normal);
+    const Vector3d first = part.Arm(frame.nodes[diaphragm.nodes[0]]);
+    for (const std::size_t node : diaphragm.nodes) {
+        const Vector3d height =
+            (part.Arm(frame.nodes[node]) - first)(normal)*Vector3d::Unit(normal);
+        for (Eigen::Index d = 0; d < 3; ++d) {
+            if (d == normal) continue;
+            Row6 row = MotionRow(static_cast<std::size_t>(d), height);
+            row.head<3>().setZero();
+            part.support.push_back(row);
+        }
+    }
+}
+
+void AddTies(const T_FRAME& frame, const TiedDirections& tied, CParts& parts,
+             std::vector<T_PART*>& partOf)
 {
     for (const T_ELEMENT& e : frame.elements) {
         T_PART& part = *partOf[parts.Root(e.i)];
@@ -147,6 +164,9 @@ void AddSprings(const T_FRAME& frame, const TiedDirections& tied, CParts& parts,
         for (std::size_t k = 1; k < equal.nodes.size(); ++k)
             AddDifference(frame, equal.nodes[0], equal.nodes[k], equal.directions,
                           *partOf[parts.Root(equal.nodes[0])]);
+    for (const T_DIAPHRAGM& diaphragm : frame.diaphragms)
+        if (!diaphragm.nodes.empty())
+            AddDiaphragm(frame, diaphragm, *partOf[parts.Root(diaphragm.nodes[0])]);
 }
 
 MatrixXd Stacked(const std::vector<Row6>& rows, const MatrixXd& basis)
@@ -312,7 +332,7 @@ std::optional<T_SOLVER_ERROR> CheckRigidBodies(const T_FRAME& frame)
         Locate(frame, part);
         AddNodes(frame, tied, part);
     }
-    AddSprings(frame, tied, parts, partOf);
+    AddTies(frame, tied, parts, partOf);
     for (T_PART& part : all)
         if (const MatrixXd motions = FreeMotions(part); motions.cols() > 0)
             return Describe(part, motions);

@@ -14,10 +14,11 @@ namespace solver {
 /// Method: elements, diaphragms and equal displacements connect nodes to parts. The six rigid-body
 /// motions about the centroid of a part, rotations times its size, are tested by the rank of what
 /// resists them: fixed directions, springs to the ground, and links and equal displacements between
-/// nodes apart, which resist turning. A motion that moves no displacement of the part is no motion:
-/// a straight chain of trusses that spins about its axis. Only rotations that beams, links or
-/// constraints tie to the part count, so a fixed rotation of a node of trusses holds nothing.
-/// Mechanisms inside a part are not seen here; the factorisation finds those.
+/// nodes apart, which resist turning, as nodes of a diaphragm do that are not of one height. A
+/// motion that moves no displacement of the part is no motion: a straight chain of trusses that
+/// spins about its axis. Only rotations that beams, links or constraints tie to the part count, so
+/// a fixed rotation of a node of trusses holds nothing. Mechanisms inside a part are not seen here;
+/// the factorisation finds those.
 std::optional<T_SOLVER_ERROR> CheckRigidBodies(const T_FRAME& frame);
 
 } // namespace solver

@@ -1,5 +1,7 @@
 #include "qm_solver/element/beamelement.h"
 
+#include "qm_solver/model/fine.h"
+
 #include <algorithm>
 
 namespace solver {
@@ -184,23 +186,66 @@ T_VEC12 CBeamElement::EndDisplacements(const T_VEC12& displacement) const
     return local;
 }
 
+/// In twice the digits: a stiff beam that turns with a soft one strains by what is left of its
+/// movement when that of a rigid body is taken off.
+CBeamElement::T_DEFORMATION CBeamElement::Deformation(const T_VEC12& displacement,
+                                                      const T_VEC12& rest) const
+{
+    std::array<CFine, 12> u;
+    for (std::size_t i = 0; i < 12; ++i)
+        u[i] = CFine(displacement[i]) + rest[i];
+    const auto turned = [&](std::size_t first, const T_VEC3& arm, std::size_t d) {
+        const std::size_t a = (d + 1) % 3, b = (d + 2) % 3;
+        return u[first + a] * arm[b] - u[first + b] * arm[a];
+    };
+    std::array<CFine, 3> drift, twist; // of J against I
+    for (std::size_t d = 0; d < 3; ++d) {
+        twist[d] = u[9 + d] - u[3 + d];
+        drift[d] = u[6 + d] - u[d];
+        if (m_hasOffset) drift[d] = drift[d] + turned(9, m_offsetJ, d) - turned(3, m_offsetI, d);
+    }
+    const auto along = [&](std::size_t axis, const CFine* of) {
+        const T_VEC3& e = m_axes[axis];
+        return of[0] * e[0] + of[1] * e[1] + of[2] * e[2];
+    };
+    const CFine chordY = -along(2, drift.data()) / m_shape.length;
+    const CFine chordZ = along(1, drift.data()) / m_shape.length;
+    T_DEFORMATION d;
+    d.chordY = chordY.Value();
+    d.chordZ = chordZ.Value();
+    d.strain[4] = (along(1, &u[3]) - chordY).Value();
+    d.strain[5] = (along(2, &u[3]) - chordZ).Value();
+    d.strain[6] = along(0, drift.data()).Value();
+    d.strain[9] = along(0, twist.data()).Value();
+    d.strain[10] = (along(1, &u[9]) - chordY).Value();
+    d.strain[11] = (along(2, &u[9]) - chordZ).Value();
+    return d;
+}
+
 double CBeamElement::StrainEnergy(const T_VEC12& displacement) const
 {
-    const T_VEC12 u = EndDisplacements(displacement);
-    // Less the rigid-body motion of I's translation, the chord's rotation and I's twist.
-    const double chordY = (u[2] - u[8]) / m_shape.length, chordZ = (u[7] - u[1]) / m_shape.length;
-    T_VEC12 strain{};
-    strain[4] = u[4] - chordY;
-    strain[5] = u[5] - chordZ;
-    strain[6] = u[6] - u[0];
-    strain[9] = u[9] - u[3];
-    strain[10] = u[10] - chordY;
-    strain[11] = u[11] - chordZ;
+    const T_DEFORMATION d = Deformation(displacement, {});
     double energy = 0.0;
     for (std::size_t i = 0; i < 12; ++i)
         for (std::size_t j = 0; j < 12; ++j)
-            energy += strain[i] * m_local[i][j] * strain[j];
-    return energy + m_tension * m_shape.length * (chordY * chordY + chordZ * chordZ);
+            energy += d.strain[i] * m_local[i][j] * d.strain[j];
+    return energy + m_tension * m_shape.length * (d.chordY * d.chordY + d.chordZ * d.chordZ);
+}
+
+T_VEC12 CBeamElement::DeformationForces(const T_VEC12& displacement, const T_VEC12& rest) const
+{
+    const T_DEFORMATION d = Deformation(displacement, rest);
+    T_VEC12 forces{};
+    for (const std::size_t i : {4u, 5u, 6u, 9u, 10u, 11u})
+        for (std::size_t j = 0; j < 12; ++j)
+            forces[i] += m_local[i][j] * d.strain[j];
+    forces[0] = -forces[6];
+    forces[3] = -forces[9];
+    forces[1] = (forces[5] + forces[11]) / m_shape.length - m_tension * d.chordZ;
+    forces[7] = -forces[1];
+    forces[2] = m_tension * d.chordY - (forces[4] + forces[10]) / m_shape.length;
+    forces[8] = -forces[2];
+    return forces;
 }
 
 T_VEC12 CBeamElement::EndForces(const T_VEC12& displacement, const T_VEC12& fixedEnd) const

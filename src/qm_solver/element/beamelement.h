@@ -41,6 +41,10 @@ public:
     /// tension does when the chord turns.
     double StrainEnergy(const T_VEC12& displacement) const;
 
+    /// Forces of the ends on the beam, local axes, under displacements of the nodes plus the rest
+    /// that doubles round away (global axes), from the deformations: exact where EndForces loses
+    /// what the rigid-body motion outweighs them by.
+    T_VEC12 DeformationForces(const T_VEC12& displacement, const T_VEC12& rest) const;
     /// Forces of the ends on the beam, local axes, when all node displacements are 0, the
     /// releases having given way. axial: the tension that a clamped beam would have from initial
     /// strains.
@@ -69,6 +73,13 @@ private:
         T_VEC12 gain; // column of the stiffness over its diagonal when `at` was released
         double pivot;
     };
+    /// Ends' displacements less the rigid-body motion of I's translation, the chord's rotation and
+    /// I's twist: local axes, 0 where that takes all.
+    struct T_DEFORMATION {
+        T_VEC12 strain{};
+        double chordY = 0.0, chordZ = 0.0; // rotation of the chord
+    };
+    T_DEFORMATION Deformation(const T_VEC12& displacement, const T_VEC12& rest) const;
     T_VEC12 EndDisplacements(const T_VEC12& displacement) const;
     void MakeLocalStiffness(const T_MATERIAL& material, const T_SECTION& section);
     void Release(std::size_t at, double diagonal);

@@ -23,6 +23,13 @@ struct T_HISTORY {
     std::vector<T_AXIAL> axial; // by element; empty: first order
 };
 
+/// Unknowns of a block of load cases, columns as of CCaseBlock::RightSides.
+struct T_SOLUTION {
+    std::vector<double> x, rest; // unknowns are x + rest; `rest` is empty where none was refined
+    std::vector<char> fine;      // by column: was refined
+    std::vector<T_ACCURACY> accuracy; // by column
+};
+
 /// Goes through the elements once for all cases of the block. Frame, map and history must outlive
 /// it.
 class CCaseBlock {
@@ -34,10 +41,18 @@ public:
     /// One column per case: T' (nodal loads - fixed-end forces - forces of settlements).
     std::vector<double> RightSides() const;
 
-    /// Results from the unknowns (columns as of RightSides), appended to `out`.
-    void Recover(std::span<const double> unknowns, std::vector<T_RESULT>& out) const;
+    /// Results from the unknowns, appended to `out`.
+    void Recover(const T_SOLUTION& solution, std::vector<T_RESULT>& out) const;
 
     using T_FIELD = std::vector<double>; // by full index
+    /// Displacements by column and, of columns solved beyond the precision of doubles, the rest
+    /// that doubles round away; `rest` is empty, or empty in the other columns.
+    struct T_FIELDS {
+        std::vector<T_FIELD> displacement, rest;
+    };
+    /// Columns of loads less the elements' forces, from the elements' deformations, where `wanted`
+    /// by column; 0 in the others. With a rest.
+    std::vector<double> Unbalanced(const T_SOLUTION& solution, std::span<const char> wanted) const;
     /// All displacements, by column.
     std::vector<T_FIELD> Displacements(std::span<const double> unknowns) const;
     /// Results from all displacements, by column, appended to `out`.
@@ -49,8 +64,11 @@ private:
     /// Calls use(case, forces at its nodes, result) for element e under the displacements of each
     /// case that has `wanted(case)`.
     template <class WANTED, class USE>
-    void ForElement(std::size_t e, std::span<const T_FIELD> displacement, INSIDE inside,
-                    WANTED&& wanted, USE&& use) const;
+    void ForElement(std::size_t e, const T_FIELDS& fields, INSIDE inside, WANTED&& wanted,
+                    USE&& use) const;
+    T_FIELDS FineFields(const T_SOLUTION& solution, std::span<const char> wanted) const;
+    void Results(const T_FIELDS& fields, std::vector<T_RESULT>& out) const;
+    std::vector<double> Reduced(std::span<const T_FIELD> full) const;
     bool Acts(std::size_t e, std::size_t c, const T_FIELD& held) const;
     T_AXIAL Axial(std::size_t e) const;
     bool Birth(std::size_t e, std::size_t c, T_VEC12& displacement) const;

@@ -1,5 +1,7 @@
 #include "qm_solver/frame/framedofs.h"
 
+#include "qm_solver/model/fine.h"
+
 #include <algorithm>
 
 namespace solver {
@@ -93,6 +95,20 @@ void CFrameDofs::Expand(std::span<const double> q, std::span<double> full) const
         for (const T_TERM& t : Terms(i))
             sum += t.factor * q[static_cast<std::size_t>(t.index)];
         full[i] = sum;
+    }
+}
+
+void CFrameDofs::Expand(std::span<const double> q, std::span<const double> rest,
+                        std::span<double> full, std::span<double> fullRest) const
+{
+    for (std::size_t i = 0; i < FullCount(); ++i) {
+        CFine sum;
+        for (const T_TERM& t : Terms(i)) {
+            const auto at = static_cast<std::size_t>(t.index);
+            sum = sum + (CFine(q[at]) + rest[at]) * t.factor;
+        }
+        full[i] = sum.Value();
+        fullRest[i] = sum.Rest();
     }
 }
 

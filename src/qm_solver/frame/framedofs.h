@@ -47,6 +47,9 @@ public:
 
     /// u = T q; `full` is overwritten.
     void Expand(std::span<const double> q, std::span<double> full) const;
+    /// The same of unknowns q + rest, as full + fullRest: `rest` is what doubles round away.
+    void Expand(std::span<const double> q, std::span<const double> rest, std::span<double> full,
+                std::span<double> fullRest) const;
     /// q += T' f.
     void Reduce(std::span<const double> full, std::span<double> q) const;
 

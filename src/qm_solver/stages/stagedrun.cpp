@@ -205,20 +205,18 @@ CStagedRun::T_FAULT CStagedRun::SolveBlock(std::span<const std::size_t> cases)
     history.birth = m_records.Births(part, std::move(columns));
     history.axial = m_now.axial;
     const CCaseBlock block(part.Frame(), part.Dofs(), loads, &history);
-    const std::vector<double> sides = block.RightSides();
-    std::vector<double> x = sides;
-    const std::size_t n = part.Dofs().EquationCount();
+    T_SOLUTION solution;
     T_SOLVER_REASON reason;
-    if (n > 0 && !part.Factor().Solve(x, cases.size(), reason))
-        return Fault(SOLVER_FAULT::Failed, reason);
-    for (std::size_t k = 0; k < cases.size() && n > 0; ++k)
-        if (!InBalance(part.Matrix(), part.Dofs(), part.Size(), std::span(sides).subspan(k * n, n),
-                       std::span(x).subspan(k * n, n))) {
-            T_SOLVER_ERROR error = Fault(SOLVER_FAULT::Failed, kOutOfBalance);
-            error.loadCase = static_cast<long>(cases[k]);
-            return error;
-        }
-    std::vector<T_FIELD> moved = block.Displacements(x);
+    std::size_t at = 0;
+    if (!SolveBalanced(block, part.Dofs(), part.Size(), part.Matrix(), part.Factor(), solution, at,
+                       reason)) {
+        T_SOLVER_ERROR error = Fault(SOLVER_FAULT::Failed, reason);
+        error.loadCase = at < cases.size() ? static_cast<long>(cases[at]) : -1;
+        return error;
+    }
+    for (const T_ACCURACY& known : solution.accuracy)
+        if (known.unrefined > m_cost.accuracy.unrefined) m_cost.accuracy = known;
+    std::vector<T_FIELD> moved = block.Displacements(solution.x);
     for (std::size_t k = 0; k < cases.size(); ++k)
         m_now.moved[cases[k]] = std::make_shared<const T_FIELD>(std::move(moved[k]));
     return {};

@@ -1,6 +1,6 @@
 #include "qm_solver/checks/stabilitycheck.h"
 
-#include "frames.h"
+#include "solved.h"
 
 #include <gtest/gtest.h>
 
@@ -168,6 +168,25 @@ TEST(StabilityCheck, TakesAPlaneFrameAsThePlaneRestrainsIt)
     for (T_ELEMENT& e : frame.elements) // as trusses: the middle swings, but no rigid body does
         e.kind = ELEMENT_KIND::Truss;
     EXPECT_FALSE(CheckRigidBodies(frame));
+}
+
+TEST(StabilityCheck, ADiaphragmOverTwoHeightsHoldsAPost)
+{
+    T_FRAME frame = Empty(); // its plane lets neither node move sideways against the other
+    Fix(frame, AddNode(frame, {0, 0, 0}), {X, Y, Z, RZ});
+    AddNode(frame, {0, 0, 3});
+    Join(frame, ELEMENT_KIND::Beam, 0, 1);
+    EXPECT_TRUE(CheckRigidBodies(frame));
+    frame.diaphragms.push_back({{0, 1}, 2});
+    EXPECT_FALSE(CheckRigidBodies(frame));
+    T_LOAD_CASE push;
+    push.nodal.push_back({1, {10, 0, 0, 0, 0, 0}});
+    const T_RESULT r = Solved(frame, push);
+    EXPECT_NEAR(-10.0, r.reaction[0][0], 1e-12);
+    EXPECT_NEAR(0.0, r.displacement[1][0], 1e-15);
+    frame.nodes[1].xyz[2] = 0.0; // of one height it holds no turning
+    frame.nodes[1].xyz[0] = 3.0;
+    EXPECT_TRUE(CheckRigidBodies(frame));
 }
 
 TEST(StabilityCheck, LeavesLooseNodesAndEmptyFramesAlone)

@@ -1,4 +1,4 @@
-#include "analysisresults.h"
+#include "analysis/analysisresults.h"
 
 #include "qm_base/say.h"
 

@@ -1,4 +1,4 @@
-#include "analysistext.h"
+#include "analysis/analysistext.h"
 
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
@@ -167,9 +167,9 @@ std::string StageTitle(const T_SHOWN_STAGE& stage)
 }
 
 std::string CaseTables(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& results,
-                       const T_UNITS& units)
+                       const T_RESULT_CHOICE& choice, const T_UNITS& units)
 {
-    const T_CASE_RESULTS r = WithoutRounding(results);
+    const T_CASE_RESULTS r = Chosen(WithoutRounding(results), choice);
     const std::string force = ForceName(units), length = LengthName(units);
     std::string text = "\n== " + shown.name + "\n\n" + Say("IDS_QM_CLI_DISPLACEMENTS") + "\n" +
                        Head(Say("IDS_QM_CLI_NODE"), Dofs("D", length, "R", "rad"));
@@ -186,6 +186,52 @@ std::string CaseTables(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& results,
         text += FormatText("%10d", row.id) + Column(row.value) + "\n";
     if (!r.beams.empty()) text += BeamTable(r, units);
     return text;
+}
+
+namespace {
+
+/// "DX (m)"; the unit of a component by its first letters and table.
+std::string WithUnit(const std::string& component, bool moves, const T_UNITS& units)
+{
+    const char first = component[0];
+    if (moves) return component + " (" + (first == 'D' ? LengthName(units) : "rad") + ")";
+    return component + " (" + (first == 'M' ? MomentName(units) : ForceName(units)) + ")";
+}
+
+std::string EnvelopeTable(const char* title, const char* id,
+                          const std::vector<T_ENVELOPE_ROW>& rows, bool moves,
+                          const std::vector<T_SHOWN_CASE>& shown, const T_UNITS& units)
+{
+    if (rows.empty()) return {};
+    std::string text = "\n" + Say(title) + "\n" + FormatText("%10s  %-16s", Say(id).c_str(), "") +
+                       FormatText(" %13s  %-20s", Say("IDS_QM_CLI_SMALLEST").c_str(), "") +
+                       FormatText(" %13s", Say("IDS_QM_CLI_LARGEST").c_str()) + "\n";
+    for (const T_ENVELOPE_ROW& row : rows)
+        text += FormatText("%10d  %-16s", row.id, WithUnit(row.component, moves, units).c_str()) +
+                Column(row.min) + FormatText("  %-20s", shown[row.minCase].name.c_str()) +
+                Column(row.max) + "  " + shown[row.maxCase].name + "\n";
+    return text;
+}
+
+} // namespace
+
+std::string EnvelopeTables(const std::vector<T_SHOWN_CASE>& shown,
+                           const std::vector<T_CASE_RESULTS>& results,
+                           const T_RESULT_CHOICE& choice, const T_UNITS& units)
+{
+    if (shown.empty()) return {};
+    std::vector<T_CASE_RESULTS> clean;
+    for (const T_CASE_RESULTS& r : results)
+        clean.push_back(WithoutRounding(r));
+    const T_ENVELOPE e = EnvelopeOf(clean, choice);
+    const auto table = [&](const char* title, const char* id, const auto& rows, bool moves) {
+        return EnvelopeTable(title, id, rows, moves, shown, units);
+    };
+    return "\n== " + Say("IDS_QM_CLI_ENVELOPE", std::to_string(shown.size())) + "\n" +
+           table("IDS_QM_CLI_DISPLACEMENTS", "IDS_QM_CLI_NODE", e.displacements, true) +
+           table("IDS_QM_CLI_REACTIONS", "IDS_QM_CLI_NODE", e.reactions, false) +
+           table("IDS_QM_CLI_TRUSS_FORCES", "IDS_QM_CLI_ELEMENT", e.trusses, false) +
+           table("IDS_QM_CLI_BEAM_FORCES", "IDS_QM_CLI_ELEMENT", e.beams, false);
 }
 
 std::string CaseSummary(const T_SHOWN_CASE& shown, const T_CASE_RESULTS& r, const T_UNITS& units)
