@@ -30,12 +30,7 @@ int CPO_LoadCaseDlg::Dlg2Data(T_POLC_D& data)
 {
     if (!CheckData()) return 0;
     T_POLC_D result = m_case;
-    if (m_patternsEdited && !result.patterns.empty()) {
-        result.patternKind = result.patterns.front().kind;
-        result.modes.clear();
-        for (const T_POLC_PATTERN& r : result.patterns)
-            if (IsModePattern(r.kind)) result.modes.push_back(r.number);
-    }
+    if (m_patternsEdited) TakeMasterPattern(result);
     data = std::move(result);
     return 1;
 }

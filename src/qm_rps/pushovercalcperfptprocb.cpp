@@ -67,16 +67,24 @@ CPushOverCalcPerfPtProcB::SWEEP CPushOverCalcPerfPtProcB::Step(double mu, double
 int CPushOverCalcPerfPtProcB::CrossLocus(double& Dp, double& Ap, double& beta)
 {
     constexpr double kVertical = 1e-9; // relative difference of D below which A interpolates
+    const auto same = [](double a, double b) {
+        return std::fabs(b - a) <= kVertical * std::max(std::fabs(a), std::fabs(b));
+    };
     for (std::size_t i = 0; i + 1 < m_traceD.size(); ++i) {
         const T_POINT2 from{m_traceD[i], m_traceA[i]}, to{m_traceD[i + 1], m_traceA[i + 1]};
-        T_POINT2 point;
-        if (!IntersectSegmentWithCapacity(from, to, point)) continue;
-        const bool vertical =
-            std::fabs(to.x - from.x) <= kVertical * std::max(std::fabs(to.x), std::fabs(from.x));
-        const double w =
-            vertical ? (point.y - from.y) / (to.y - from.y) : (point.x - from.x) / (to.x - from.x);
+        // Of an elastic structure the locus stays in one point of the capacity, but for rounding.
+        const bool stays = same(from.x, to.x) && same(from.y, to.y);
+        double onCurve = 0.0, w = 0.0;
+        T_POINT2 point = from;
+        if (stays) {
+            if (!GetCapacityAccelAt(from.x, onCurve) || !same(from.y, onCurve)) continue;
+        } else {
+            if (!IntersectSegmentWithCapacity(from, to, point)) continue;
+            w = same(from.x, to.x) ? (point.y - from.y) / (to.y - from.y)
+                                   : (point.x - from.x) / (to.x - from.x);
+        }
         beta = m_traceBeta[i] + (m_traceBeta[i + 1] - m_traceBeta[i]) * w;
-        if (!std::isfinite(beta)) return 0;
+        if (!std::isfinite(beta)) continue;
         Dp = point.x;
         Ap = point.y;
         return 1;

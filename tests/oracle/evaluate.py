@@ -103,6 +103,10 @@ def vertical_crossing(d, xs, ys):
     return None
 
 
+def same(a, b):
+    return abs(a - b) <= 1e-9 * max(abs(a), abs(b))
+
+
 def first_crossing_of_segment(p1, p2, xs, ys):
     """First curve segment, in order, that the segment p1-p2 crosses."""
     for i in range(len(xs) - 1):
@@ -500,7 +504,8 @@ class PerformancePoint:
         return div(div(ap - ay, dp - dy), div(ay, dy))
 
     def is_elastic(self, beta):
-        return self.elastic > beta or abs(beta - 5.0) < 0.001  # 5, not the setting: meant
+        # Rounding apart; 5, not the setting: meant.
+        return self.elastic - beta > 1e-9 * self.elastic or abs(beta - 5.0) < 0.001
 
     def crossing_with(self, xs, ys):
         """Capacity segments outward; on one segment the crossing nearest its start."""
@@ -592,8 +597,8 @@ class PerformancePoint:
         Only a note for the comparison of two programs; it changes no result.
         """
         ax, ay = q[0] - p[0], q[1] - p[1]
-        if abs(ax) < 1e-9 * q[0] and abs(ay) < 1e-9 * q[1]:
-            return True  # no length
+        if same(p[0], q[0]) and same(p[1], q[1]):
+            return False  # no length
         for i in range(len(self.Sd) - 1):
             x, y = self.Sd[i], self.Sa[i]
             bx, by = self.Sd[i + 1] - x, self.Sa[i + 1] - y
@@ -642,16 +647,19 @@ class PerformancePoint:
         for i in range(len(trace) - 1):
             p, q = trace[i], trace[i + 1]
             self.by_rounding = self.by_rounding or self.delicate(p, q, i == 0)
-            hit = first_crossing_of_segment(p, q, self.Sd, self.Sa)
+            part = 0.0
+            if same(p[0], q[0]) and same(p[1], q[1]):  # an elastic structure's trace stays
+                on_curve = self.accel_at(p[0])
+                hit = p if on_curve is not None and same(p[1], on_curve) else None
+            else:
+                hit = first_crossing_of_segment(p, q, self.Sd, self.Sa)
             if not hit:
                 continue
-            if abs(q[0] - p[0]) > 1e-9 * max(abs(p[0]), abs(q[0])):
+            if not same(p[0], q[0]):
                 part = (hit[0] - p[0]) / (q[0] - p[0])
-            else:
-                part = div(hit[1] - p[1], q[1] - p[1])
+            elif not same(p[1], q[1]):
+                part = (hit[1] - p[1]) / (q[1] - p[1])
             beta = betas[i] + (betas[i + 1] - betas[i]) * part
-            if self.elastic != 5.0 and abs(beta - self.elastic) < 1e-9:
-                self.by_rounding = True  # "elastic" or "found" hangs on the sign of a zero
             return hit[0], hit[1], beta, self.is_elastic(beta)
         raise Fail("capacity ends before 1.2 dy" if len(trace) == 1
                    else "the trace does not cross the capacity")

@@ -69,6 +69,27 @@ TEST(PerfPtProcB, AnUprightLocusIsInterpolatedByAcceleration)
     EXPECT_NEAR(2.0 * SRv, run.D, 1e-4) << "chords of the table";
 }
 
+TEST(PerfPtProcB, AnElasticStructureIsFoundWhateverTheRounding)
+{
+    // Below the plateau the locus is one point, (L, L), to the last bits or not.
+    for (const double elasticPct : {5.0, 7.0}) {
+        T_DAMP_PARAM damping;
+        damping.elasticPct = elasticPct;
+        std::vector<int> results(3, 0);
+        for (int i = 1; i < 200; ++i) {
+            const double level = 0.1 + 0.00437 * i;
+            CTestRecord record(kPlateau, Level(level), damping, kGravityUnit);
+            const T_RUN run = RunPerfPt<CALC>(record);
+            ++results.at(static_cast<std::size_t>(run.result));
+            EXPECT_NEAR(level, run.D, 1e-6) << level;
+            EXPECT_NEAR(elasticPct, run.beta.value_or(0.0), 1e-6) << level;
+        }
+        // 5 % is named elastic; another damping would have to be above beta, which it equals.
+        EXPECT_EQ(elasticPct == 5.0 ? (std::vector<int>{0, 0, 199}) : (std::vector<int>{0, 199, 0}),
+                  results);
+    }
+}
+
 TEST(PerfPtProcB, AMissedPeriodLineIsPassedOver)
 {
     // Periods up to 1.2 s only: Teff = sqrt(mu) finds the demand at mu = 1.2 and 1.4.

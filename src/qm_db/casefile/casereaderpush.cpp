@@ -1,11 +1,24 @@
 #include "qm_db/casefile/casereadertable.h"
+#include "qm_db/records/loadcaserules.h"
 
 namespace {
 
 constexpr int kFirstModeKind = 2; // "mode" and "mode x story mass" need mode numbers
 
+/// The kind and the modes are those of the rows where there are rows: an evaluation reads them, the
+/// push reads the rows.
+void CheckAgainstRows(CJsonReader in, const T_POLC_D& push)
+{
+    T_POLC_D byRows = push;
+    TakeMasterPattern(byRows);
+    if (byRows.patternKind != push.patternKind) in.Fail("IDS_QM_CASE_PATTERN_ROWS");
+    if (push.patternKind >= kFirstModeKind && byRows.modes != push.modes)
+        in.Fail("IDS_QM_CASE_PATTERN_ROWS");
+}
+
 void CheckPattern(CJsonReader in, const T_MODEL& model, const T_POLC_D& push)
 {
+    CheckAgainstRows(in, push);
     if (push.patternKind >= kFirstModeKind && push.modes.empty())
         in.Fail("IDS_QM_CASE_NEEDS_MODES");
     in.CheckEach(

@@ -87,6 +87,15 @@ constexpr T_RECORD_RULE<T_ROW_PLACE> kPlaceRules[] = {
 
 } // namespace
 
+void TakeMasterPattern(T_POLC_D& record)
+{
+    if (record.patterns.empty()) return;
+    record.patternKind = record.patterns.front().kind;
+    record.modes.clear();
+    for (const T_POLC_PATTERN& row : record.patterns)
+        if (IsModePattern(row.kind)) record.modes.push_back(row.number);
+}
+
 std::vector<T_FINDING> LoadCaseFindings(const T_POLC_D& record, const T_MODEL& model)
 {
     const T_POLC_CONTROL none;

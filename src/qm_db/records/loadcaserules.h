@@ -14,6 +14,10 @@ inline bool IsModePattern(int kind)
 
 /// Rules of the record that are not kept, in the order of the check. A case without control data
 /// (another solver's) is judged by its name alone. The model tells which increment functions exist.
+/// Sets the kind of the master pattern and the modes by the pattern rows, where there are rows:
+/// the kind of the first one and the mode numbers in their order.
+void TakeMasterPattern(T_POLC_D& record);
+
 std::vector<T_FINDING> LoadCaseFindings(const T_POLC_D& record, const T_MODEL& model);
 
 /// What is wrong with a pattern row by itself; its field starts with `prefix`.

@@ -12,7 +12,8 @@ namespace {
 
 // The log names the calculators, whose operations these are.
 constexpr const char* kSource = "src/qm_rps/pushovercalcperfptbase";
-constexpr double kMaxBeta0 = 45.0; // hysteretic damping is not taken above this, per cent
+constexpr double kDampingRounding = 1e-9; // relative
+constexpr double kMaxBeta0 = 45.0;        // hysteretic damping is not taken above this, per cent
 
 struct T_KAPPA_ROW {
     int type;
@@ -149,7 +150,9 @@ double CPerfPtOperations::GetDampingModificationFactor(int type, double& beta0,
 
 bool CPerfPtOperations::IsElasticDamping(double beta) const
 {
-    return m_record.Damping().elasticPct > beta || std::fabs(beta - 5.0) < 0.001;
+    // A beta that is the elastic damping but for its rounding is not below it.
+    const double elastic = m_record.Damping().elasticPct;
+    return elastic - beta > kDampingRounding * elastic || std::fabs(beta - 5.0) < 0.001;
 }
 
 int CPerfPtOperations::CoefficientRow(double alpha) const
