@@ -159,7 +159,7 @@ void CFramePane::ShowStep()
     const S& source = m_sources[static_cast<std::size_t>(std::max(m_source->currentIndex(), 0))];
     const int step = m_slider->value();
     T_FRAME_PICTURE picture;
-    picture.scene = &m_scene.Scene();
+    picture.scene = &m_scene.SceneOf(source);
     picture.subtitle = NameOf(source).toStdString();
     if (m_scene.Read(source, step, m_moves)) {
         if (source.kind != S::KIND::None) picture.displacement = &m_moves;

@@ -103,7 +103,7 @@ T_COMMANDS LoadCaseCommands(T_DESKTOP& desktop)
     const auto list = [&desktop] {
         (void)CreateOrActivateRPSDlg(&desktop.doc, IDD_PO_LOADCASE_LIST, &desktop.view, nullptr);
     };
-    return {{kMenu, "IDS_QM_UI_POLC_LIST", "Ctrl+L", list},
+    return {{kMenu, "IDS_QM_UI_POLC_LIST", "Ctrl+Shift+P", list},
             {kMenu},
             {kMenu, "IDS_QM_UI_FIGURE_MENU_0", "", Figure(3)},
             {kMenu, "IDS_QM_UI_FIGURE_MENU_E", "", Figure(4)},

@@ -263,18 +263,27 @@ T_COMMANDS CMainWindow::ViewCommands()
                          {},
                          [this, which] { return m_framePane->View().Options().*which; }};
     };
+    const auto pane = [this, kMenu](const char* key) {
+        auto* dock = findChild<QDockWidget*>(QLatin1String(key));
+        return T_COMMAND{kMenu, key,
+                         "",    [dock] { dock->setVisible(dock->isHidden()); },
+                         {},    [dock] { return !dock->isHidden(); }};
+    };
     using O = T_FRAME_OPTIONS;
     return {{kMenu, "IDS_QM_UI_VIEW_ISO", "Alt+1", look(kIsometric)},
             {kMenu, "IDS_QM_UI_VIEW_XZ", "Alt+2", look(kElevationXZ)},
             {kMenu, "IDS_QM_UI_VIEW_YZ", "Alt+3", look(kElevationYZ)},
             {kMenu, "IDS_QM_UI_VIEW_XY", "Alt+4", look(kPlanXY)},
             {kMenu},
-            flag("IDS_QM_UI_VIEW_NODES", "Alt+N", &O::nodeNumbers),
-            flag("IDS_QM_UI_VIEW_ELEMENTS", "Alt+E", &O::elementNumbers),
+            flag("IDS_QM_UI_VIEW_NODES", "Ctrl+Alt+N", &O::nodeNumbers),
+            flag("IDS_QM_UI_VIEW_ELEMENTS", "Ctrl+Alt+E", &O::elementNumbers),
             flag("IDS_QM_UI_VIEW_SUPPORTS", "", &O::supports),
             flag("IDS_QM_UI_VIEW_HINGES", "", &O::hinges),
             flag("IDS_QM_UI_VIEW_DRIFTS", "", &O::drifts),
-            flag("IDS_QM_UI_VIEW_BEFORE", "", &O::undeformed)};
+            flag("IDS_QM_UI_VIEW_BEFORE", "", &O::undeformed),
+            {kMenu},
+            pane("IDS_QM_UI_EXPLORER"),
+            pane("IDS_QM_UI_MESSAGES")};
 }
 
 T_COMMANDS CMainWindow::WindowCommands()
@@ -355,6 +364,7 @@ void CMainWindow::AddRecent(const QString& path)
     list.removeAll(path);
     list.prepend(path);
     QSettings().setValue(kRecentKey, list.mid(0, kMostRecent));
+    ShowRecent();
 }
 
 void CMainWindow::ShowRecent()

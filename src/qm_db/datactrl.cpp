@@ -9,8 +9,24 @@
 void CDataCtrl::Assign(T_MODEL_CONTENT content)
 {
     m_content = std::move(content);
-    m_modified = false;
+    m_place = 0;
+    SetModified(false);
     ++m_revision;
+}
+
+void CDataCtrl::SetModified(bool modified)
+{
+    if (!modified)
+        m_saved = m_place;
+    else if (!m_modified)
+        m_saved = kNowhere;
+    m_modified = modified;
+}
+
+void CDataCtrl::ComeTo(long place)
+{
+    m_place = place;
+    m_modified = m_place != m_saved;
 }
 
 void CDataCtrl::SetStaticResult(int loadCase, std::shared_ptr<IStaticResult> result)
@@ -19,14 +35,14 @@ void CDataCtrl::SetStaticResult(int loadCase, std::shared_ptr<IStaticResult> res
         m_content.staticResults[loadCase] = std::move(result);
     else
         m_content.staticResults.erase(loadCase);
-    m_modified = true;
+    ChangeForGood();
     ++m_revision;
 }
 
 void CDataCtrl::SetStagedResult(std::shared_ptr<IStagedResult> result)
 {
     m_content.stagedResult = std::move(result);
-    m_modified = true;
+    ChangeForGood();
     ++m_revision;
 }
 
@@ -44,6 +60,13 @@ int CDataCtrl::AddLcom(const T_LCOM_D& combination)
     return edit.Put(NextKey(table), combination) && edit.Commit();
 }
 
+/// No step takes results back.
+void CDataCtrl::ChangeForGood()
+{
+    m_saved = kNowhere;
+    m_modified = true;
+}
+
 T_MODEL& CDataCtrl::ModelForEdit()
 {
     m_modified = true;
@@ -56,5 +79,5 @@ void CDataCtrl::SetPoverSteps(int pushover, const T_POVR_D& steps)
     const auto [it, isNew] = m_content.model.poverSteps.try_emplace(pushover);
     if (!isNew && it->second == steps) return;
     it->second = steps;
-    m_modified = true;
+    ChangeForGood();
 }

@@ -32,7 +32,13 @@ public:
     CEditData* Editor() const { return m_editor; }
 
     bool IsModified() const { return m_modified; }
-    void SetModified(bool modified) { m_modified = modified; }
+    /// False: the document is saved as it is. True: it differs from any file, whatever is undone.
+    void SetModified(bool modified);
+    /// For CUndoCtrl: the place in its steps that undo or redo has come to. That of the saved
+    /// document is unmodified again, where nothing but steps has changed it.
+    void ComeTo(long place);
+    /// For CUndoCtrl: a new step leads to this place.
+    void SetPlace(long place) { m_place = place; }
     /// Grows with every change; lets readers keep derived values until something changed.
     long Revision() const { return m_revision; }
 
@@ -49,8 +55,12 @@ public:
     T_MODEL& ModelForEdit();
 
 private:
+    void ChangeForGood();
+
     T_MODEL_CONTENT m_content;
     bool m_modified = false;
+    static constexpr long kNowhere = -1;
+    long m_place = 0, m_saved = 0; // in the steps of CUndoCtrl: now, and as it was saved
     bool m_isLocked = false;
     long m_revision = 0;
     CEditData* m_editor = nullptr;

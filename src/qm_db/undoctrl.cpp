@@ -38,6 +38,7 @@ int CUndoCtrl::Undo()
     for (const T_CHANGE_ANY& change : step.changes | std::views::reverse)
         Apply(model, change, false);
     m_undone.push_back(std::move(step));
+    m_data.ComeTo(Place());
     return 1;
 }
 
@@ -50,6 +51,7 @@ int CUndoCtrl::Redo()
     for (const T_CHANGE_ANY& change : step.changes)
         Apply(model, change, true);
     m_done.push_back(std::move(step));
+    m_data.ComeTo(Place());
     return 1;
 }
 
@@ -76,12 +78,18 @@ int CUndoCtrl::CancelEditDB()
 void CUndoCtrl::Push(T_UNDO_STEP step)
 {
     m_undone.clear();
-    if (m_done.size() == kMaxSteps) m_done.erase(m_done.begin());
+    if (m_done.size() == kMaxSteps) {
+        m_first = m_done.front().place;
+        m_done.erase(m_done.begin());
+    }
+    step.place = ++m_last;
     m_done.push_back(std::move(step));
+    m_data.SetPlace(m_last);
 }
 
 void CUndoCtrl::Clear()
 {
     m_done.clear();
     m_undone.clear();
+    m_first = m_last = 0;
 }

@@ -24,6 +24,7 @@ using T_CHANGE_ANY = decltype(ChangeOf(kRecords)); // of any record
 struct T_UNDO_STEP {
     std::string title;
     std::vector<T_CHANGE_ANY> changes;
+    long place = 0; // that it leads to: a number of its own in the document
 };
 
 class CUndoCtrl {
@@ -53,7 +54,11 @@ public:
     static void Apply(T_MODEL& model, const T_CHANGE_ANY& change, bool forward);
 
 private:
+    long Place() const { return m_done.empty() ? m_first : m_done.back().place; }
+
     CDataCtrl& m_data;
+    long m_first = 0; // place before the oldest step that is kept
+    long m_last = 0;  // place of the newest step there ever was
     std::vector<T_UNDO_STEP> m_done;
     std::vector<T_UNDO_STEP> m_undone;
 };

@@ -10,6 +10,7 @@
 #include "qm_ui/plot/plotwidget.h"
 
 #include <QApplication>
+#include <QTest>
 #include <QTimer>
 
 using namespace desktop_test;
@@ -87,7 +88,12 @@ TEST_F(LoadCaseWindows, BrokenRulesAreMarkedAndRefusedAndCancelChangesNothing)
     EXPECT_FALSE(Field(window, "control.masterMaxDispl")->isVisible());
     Enter(window, "control.stiffnessRatioLimit", "-0.5");
     EXPECT_TRUE(IsMarked(window, "control.stiffnessRatioLimit"));
-    window.reject();
+    for (const auto answer : {QMessageBox::No, QMessageBox::Yes}) {
+        EXPECT_TRUE(window.isVisible());
+        CAnswers answers({CAnswers::Press(answer)});
+        QTest::keyClick(&window, Qt::Key_Escape);
+        EXPECT_TRUE(answers.m_texts.value(0).contains("what was changed"));
+    }
     Settle();
     EXPECT_FALSE(m_main->Doc().Data().IsModified());
     EXPECT_EQ(nullptr, Window("Pushover load case"));

@@ -4,8 +4,10 @@
 
 #include <QAction>
 #include <QDir>
+#include <QDockWidget>
 #include <QFileInfo>
 #include <QLocale>
+#include <QMenu>
 #include <QMenuBar>
 #include <QSlider>
 
@@ -33,12 +35,45 @@ TEST_F(MainWindow, AnEditedCellIsOneUndoableStepAndSavedOnRequest)
     EXPECT_TRUE(m_main->windowTitle().contains('*'));
     Run("IDS_QM_UI_UNDO");
     EXPECT_EQ(10.0, X2());
+    EXPECT_FALSE(m_main->windowTitle().contains('*')) << "as it was opened";
     Run("IDS_QM_UI_REDO");
+    EXPECT_TRUE(m_main->windowTitle().contains('*'));
     AnswerFileName(File("bridge.qmdb"));
     Run("IDS_QM_UI_SAVE"); // a case file is saved as a model file
     EXPECT_TRUE(QFileInfo::exists(File("bridge.qmdb")));
     EXPECT_FALSE(m_main->windowTitle().contains('*'));
     EXPECT_TRUE(m_main->Messages().contains("bridge.qmdb"));
+    Run("IDS_QM_UI_UNDO"); // away from what was saved
+    EXPECT_TRUE(m_main->windowTitle().contains('*'));
+    Run("IDS_QM_UI_REDO");
+    EXPECT_FALSE(m_main->windowTitle().contains('*'));
+}
+
+TEST_F(MainWindow, NoTwoCommandsShareAKeyOrALetter)
+{
+    for (const char* language : {"en", "it"}) {
+        m_main->SetLanguage(language);
+        QStringList keys;
+        for (const QAction* menu : m_main->menuBar()->actions()) {
+            const QString title = menu->text();
+            keys << "Alt+" + title.mid(title.indexOf('&') + 1, 1).toUpper();
+            for (const QAction* action : menu->menu()->actions())
+                if (!action->shortcut().isEmpty()) keys << action->shortcut().toString();
+        }
+        EXPECT_GT(keys.size(), 20);
+        EXPECT_EQ(0, keys.removeDuplicates()) << language;
+    }
+    m_main->SetLanguage("en");
+}
+
+TEST_F(MainWindow, AClosedPanelComesBackFromTheMenu)
+{
+    auto* panel = m_main->findChild<QDockWidget*>("IDS_QM_UI_EXPLORER");
+    ASSERT_TRUE(panel);
+    panel->close();
+    EXPECT_TRUE(panel->isHidden());
+    Run("IDS_QM_UI_EXPLORER");
+    EXPECT_FALSE(panel->isHidden());
 }
 
 TEST_F(MainWindow, ClosingWithEditsAsksAndNeverLosesThemSilently)
@@ -120,6 +155,19 @@ TEST_F(MainWindow, TheFrameIsShownUnderEveryStepOfAPushover)
         ASSERT_TRUE(m_main->Doc().Post().GetDispNew(control, u));
         EXPECT_EQ(u, (*frame.View().Picture().displacement)[n][0]);
         EXPECT_EQ(3U, frame.View().Picture().drifts.size());
+    }
+}
+
+TEST_F(MainWindow, AStageShowsWhatStands)
+{
+    ASSERT_TRUE(Open("staged-two-hangers"));
+    Run("IDS_QM_UI_ANALYSE");
+    std::size_t standing = 0;
+    for (const auto& [key, stage] : Model().stages) {
+        standing += stage.activate.elements.size() - stage.deactivate.elements.size();
+        using S = T_SHAPE_SOURCE;
+        ASSERT_TRUE(m_main->Frame().Show({S::KIND::Stage, key, stage.name, stage.steps}, 1));
+        EXPECT_EQ(standing, m_main->Frame().View().Picture().scene->lines.size()) << stage.name;
     }
 }
 

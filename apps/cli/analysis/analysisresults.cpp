@@ -156,18 +156,6 @@ bool FindShownStages(CDBDoc& doc, const std::string& stage, int step, const std:
     return error.empty();
 }
 
-std::set<int> StandingElements(const T_MODEL& model, int stage)
-{
-    std::set<int> standing;
-    for (const auto& [key, record] : model.stages) {
-        if (key > stage) break;
-        for (const int id : record.deactivate.elements)
-            standing.erase(id);
-        standing.insert(record.activate.elements.begin(), record.activate.elements.end());
-    }
-    return standing;
-}
-
 bool ReadStageResults(CDBDoc& doc, const T_STAGE_CHOICE& choice, T_CASE_RESULTS& out,
                       std::string& error)
 {

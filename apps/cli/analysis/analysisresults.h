@@ -57,9 +57,6 @@ struct T_SHOWN_STAGE {
 bool FindShownStages(CDBDoc& doc, const std::string& stage, int step, const std::string& load,
                      std::vector<T_SHOWN_STAGE>& out, std::string& error);
 
-/// Ids of the elements that stand in a stage.
-std::set<int> StandingElements(const T_MODEL& model, int stage);
-
 /// What stands in a stage, of one step and load; false: `error` says why.
 bool ReadStageResults(CDBDoc& doc, const T_STAGE_CHOICE& choice, T_CASE_RESULTS& out,
                       std::string& error);

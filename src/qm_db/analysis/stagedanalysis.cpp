@@ -92,6 +92,18 @@ std::vector<int> StageLoadCases(const T_MODEL& model)
     return {keys.begin(), keys.end()};
 }
 
+std::set<int> StandingElements(const T_MODEL& model, int stage)
+{
+    std::set<int> standing;
+    for (const auto& [key, record] : model.stages) {
+        if (key > stage) break;
+        for (const int id : record.deactivate.elements)
+            standing.erase(id);
+        standing.insert(record.activate.elements.begin(), record.activate.elements.end());
+    }
+    return standing;
+}
+
 bool BelongsTo(int load, int loadCase, int group)
 {
     switch (load) {

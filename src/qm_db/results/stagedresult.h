@@ -4,6 +4,7 @@
 #include "qm_db/results/staticresult.h"
 
 #include <compare>
+#include <set>
 
 /// A result of stages: the state at the end of a step, by a load case or by a sum of them.
 struct T_STAGE_CHOICE {
@@ -43,3 +44,5 @@ public:
 
 /// Keys of the load cases that come or go at a stage, ascending.
 std::vector<int> StageLoadCases(const T_MODEL& model);
+/// Ids of the elements that stand in a stage.
+std::set<int> StandingElements(const T_MODEL& model, int stage);

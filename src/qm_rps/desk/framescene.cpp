@@ -62,6 +62,7 @@ void CFrameScene::Build()
 {
     const T_MODEL& model = m_doc.Data().Model();
     m_scene = {};
+    m_stages.clear();
     m_scene.title = model.styp.title;
     m_scene.lengthUnit = NameOf(m_doc.Unit().Units().length);
     std::map<int, std::size_t> at;
@@ -90,6 +91,24 @@ const T_FRAME_SCENE& CFrameScene::Scene()
 {
     if (m_revision != m_doc.Data().Revision()) Build();
     return m_scene;
+}
+
+const T_FRAME_SCENE& CFrameScene::SceneOf(const T_SHAPE_SOURCE& source)
+{
+    const T_FRAME_SCENE& whole = Scene();
+    if (source.kind != S::KIND::Stage) return whole;
+    const auto [at, isNew] = m_stages.try_emplace(source.key, whole);
+    T_FRAME_SCENE& stage = at->second;
+    if (!isNew) return stage;
+    const std::set<int> standing = StandingElements(m_doc.Data().Model(), source.key);
+    std::erase_if(stage.lines,
+                  [&](const T_SCENE_LINE& line) { return !standing.contains(line.id); });
+    std::vector<char> holds(stage.nodes.size(), 0);
+    for (const T_SCENE_LINE& line : stage.lines)
+        holds[line.i] = holds[line.j] = 1;
+    for (std::size_t n = 0; n < holds.size(); ++n)
+        if (!holds[n]) stage.nodes[n].held = {};
+    return stage;
 }
 
 std::vector<T_SHAPE_SOURCE> CFrameScene::Sources()

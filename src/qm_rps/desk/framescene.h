@@ -3,6 +3,8 @@
 
 #include "qm_db/dbdoc.h"
 
+#include <map>
+
 struct T_SCENE_NODE {
     int id = 0;
     std::array<double, 3> xyz{};
@@ -47,6 +49,8 @@ public:
     explicit CFrameScene(CDBDoc& doc) : m_doc(doc) {}
 
     const T_FRAME_SCENE& Scene();
+    /// The frame as a source shows it: of a stage what stands then. Nodes are those of Scene.
+    const T_FRAME_SCENE& SceneOf(const T_SHAPE_SOURCE& source);
     /// None first, then every load case, stage, pushover case and mode that has results.
     std::vector<T_SHAPE_SOURCE> Sources();
     /// Translations of the scene's nodes in current units (of a mode in its own normalisation), at
@@ -74,6 +78,7 @@ private:
 
     CDBDoc& m_doc;
     T_FRAME_SCENE m_scene;
+    std::map<int, T_FRAME_SCENE> m_stages; // by key, those that were asked for
     long m_revision = -1;
     std::string m_error;
     // Of the pushover load case that was read last: displacements by node, all steps. A node

@@ -185,7 +185,11 @@ void RegisterUlfIterationViews(CViewFactory& factory)
 {
     factory.Register<SETTINGS>(KeyText("IDS_QM_UI_ULF_SETTINGS_TITLE"), BuildSettings);
     T_VIEW result;
-    result.accept = KeyText("IDS_QM_UI_ULF_GO_ON");
+    result.accept = [](const zql::frx::MDialog& model) {
+        return MMSGFunction::GetValue(dynamic_cast<const RESULT&>(model).m_iterate
+                                          ? "IDS_QM_UI_ULF_GO_ON"
+                                          : "IDS_QM_UI_ULF_END");
+    };
     factory.Register<RESULT>(KeyText("IDS_QM_UI_ULF_STEP_TITLE"), BuildResult, result);
     T_VIEW run;
     run.showsOnly = true;

@@ -3,8 +3,9 @@
 #include "qm_base/checkeddialog.h"
 #include "qm_base/msgfunction.h"
 
+#include <QCloseEvent>
 #include <QDialogButtonBox>
-#include <QEvent>
+#include <QKeyEvent>
 #include <QPushButton>
 #include <QScreen>
 #include <QScrollArea>
@@ -33,6 +34,10 @@ CDialogWindow::CDialogWindow(const CViewFactory& factory, const T_VIEW& view,
     if (auto* checked = dynamic_cast<CCheckedDialog*>(&model))
         m_form->SetFindings([checked] { return checked->Findings(); });
     m_view.build(*m_form, model);
+    m_form->m_onChange = [this, before = m_form->m_onChange] {
+        if (before) before();
+        ShowTexts();
+    };
 
     m_scroll->setWidget(m_form);
     m_scroll->setWidgetResizable(true);
@@ -70,6 +75,28 @@ void CDialogWindow::reject()
     if (!m_view.closes || m_view.closes(m_model)) QDialog::reject();
 }
 
+/// Cancel says what it does; Esc and the corner of the window are pressed by mistake.
+bool CDialogWindow::MayDrop()
+{
+    if (m_view.showsOnly || !m_form->IsTouched()) return true;
+    constexpr const char* kKey = "IDS_QM_UI_DROP_CHANGES";
+    return m_dialogView.AskYesNo(kKey, zql::lib::MMSGFunction::GetValue(kKey));
+}
+
+void CDialogWindow::keyPressEvent(QKeyEvent* event)
+{
+    if (event->matches(QKeySequence::Cancel) && !MayDrop()) return;
+    QDialog::keyPressEvent(event);
+}
+
+void CDialogWindow::closeEvent(QCloseEvent* event)
+{
+    if (MayDrop())
+        QDialog::closeEvent(event);
+    else
+        event->ignore();
+}
+
 void CDialogWindow::ShowTexts()
 {
     setWindowTitle(m_view.title ? QString::fromStdString(m_view.title()) : QString());
@@ -77,7 +104,7 @@ void CDialogWindow::ShowTexts()
         if (QPushButton* button = m_buttons->button(which)) button->setText(text);
     };
     name(QDialogButtonBox::Ok,
-         m_view.accept ? QString::fromStdString(m_view.accept()) : Text("IDS_QM_UI_OK"));
+         m_view.accept ? QString::fromStdString(m_view.accept(m_model)) : Text("IDS_QM_UI_OK"));
     name(QDialogButtonBox::Cancel, Text("IDS_QM_UI_CANCEL"));
     name(QDialogButtonBox::Close, Text("IDS_QM_UI_CLOSE"));
 }

@@ -24,9 +24,12 @@ public:
 protected:
     void changeEvent(QEvent* event) override;
     void showEvent(QShowEvent* event) override;
+    void keyPressEvent(QKeyEvent* event) override;
+    void closeEvent(QCloseEvent* event) override;
 
 private:
     void ShowTexts();
+    bool MayDrop();
     QSize WantedSize() const;
 
     T_VIEW m_view;

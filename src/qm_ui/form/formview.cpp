@@ -7,6 +7,7 @@
 #include <QGroupBox>
 #include <QHBoxLayout>
 #include <QLabel>
+#include <QLineEdit>
 #include <QTabWidget>
 #include <QVBoxLayout>
 
@@ -231,20 +232,34 @@ ChangedFn CFormView::Changed()
     };
 }
 
+/// The same of a field that holds a value.
+ChangedFn CFormView::Edited()
+{
+    return [this, changed = Changed()] {
+        if (!m_refreshing) m_touched = true;
+        changed();
+    };
+}
+
+bool CFormView::IsTouched() const
+{
+    return m_touched || std::ranges::any_of(findChildren<QLineEdit*>(), &QLineEdit::isModified);
+}
+
 CFormField& CFormView::Number(TextFn caption, T_BINDING<double> binding, TextFn unit)
 {
-    return Add(std::move(caption), MakeNumberField(std::move(binding), Changed(), this), unit);
+    return Add(std::move(caption), MakeNumberField(std::move(binding), Edited(), this), unit);
 }
 
 CFormField& CFormView::Optional(TextFn caption, T_BINDING<std::optional<double>> binding,
                                 TextFn unit)
 {
-    return Add(std::move(caption), MakeOptionalField(std::move(binding), Changed(), this), unit);
+    return Add(std::move(caption), MakeOptionalField(std::move(binding), Edited(), this), unit);
 }
 
 CFormField& CFormView::Integer(TextFn caption, T_BINDING<int> binding, TextFn unit)
 {
-    return Add(std::move(caption), MakeIntegerField(std::move(binding), Changed(), this), unit);
+    return Add(std::move(caption), MakeIntegerField(std::move(binding), Edited(), this), unit);
 }
 
 CFormField& CFormView::Text(TextFn caption, T_BINDING<std::string> binding)
@@ -256,19 +271,19 @@ CFormField& CFormView::Text(TextFn caption, T_BINDING<std::string> binding)
     if (!binding.set) read = nullptr;
     return Add(std::move(caption),
                MakeTextField([get = binding.get] { return QString::fromStdString(get()); },
-                             std::move(read), Changed(), this));
+                             std::move(read), Edited(), this));
 }
 
 CFormField& CFormView::Choice(TextFn caption, T_BINDING<int> binding,
                               std::function<std::vector<std::string>()> texts)
 {
     return Add(std::move(caption),
-               MakeChoiceField(std::move(binding), std::move(texts), Changed(), this));
+               MakeChoiceField(std::move(binding), std::move(texts), Edited(), this));
 }
 
 CFormField& CFormView::Flag(TextFn caption, T_BINDING<bool> binding)
 {
-    return Add({}, MakeFlagField(std::move(binding), std::move(caption), Changed(), this));
+    return Add({}, MakeFlagField(std::move(binding), std::move(caption), Edited(), this));
 }
 
 CFormField& CFormView::Note(TextFn text)

@@ -57,7 +57,7 @@ public:
     /// A widget of the caller, made by it with this form (Host) as parent.
     CFormField& Custom(TextFn caption, std::unique_ptr<CFormField> field);
     QWidget* Host() { return this; }
-    /// Tells the form that the person has changed something.
+    /// Tells the form that the person has done something: a choice, a button.
     ChangedFn Changed();
 
     /// Rules that are not kept, asked for with each refresh.
@@ -73,6 +73,8 @@ public:
     bool Commit();
     /// Focus to the first marked field, on its page.
     void ShowFirstMark();
+    /// The person has changed a field, or is typing in one.
+    bool IsTouched() const;
     /// Number of marked fields.
     int Marks() const;
     /// The field with that name, or null.
@@ -114,4 +116,6 @@ private:
     std::vector<CGridView*> m_grids;
     std::function<std::vector<T_FINDING>()> m_findings;
     bool m_refreshing = false;
+    bool m_touched = false;
+    ChangedFn Edited();
 };

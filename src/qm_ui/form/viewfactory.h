@@ -16,8 +16,9 @@ struct T_VIEW {
     TextFn title{};
     /// Adds fields and bindings. Null for a model that has a window of its own (see window).
     std::function<void(CFormView& form, zql::frx::MDialog& model)> build{};
-    /// The text of the accepting button; empty: "OK". A window that only shows has none.
-    TextFn accept{};
+    /// The text of the accepting button, asked for after each change; empty: "OK". A window that
+    /// only shows has none.
+    std::function<std::string(const zql::frx::MDialog& model)> accept{};
     bool showsOnly = false; // one button, "Close"
     QSize size{};           // wanted; empty: what the form needs
     /// Asked before the window closes without accepting; false: it stays open. Empty: it closes.
