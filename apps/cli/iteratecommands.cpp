@@ -309,9 +309,8 @@ EXIT_CODE RunUlfIterate(const T_ITERATE_OPTIONS& o)
     const std::string said = run.Said() ? run.Said()->text : std::string();
     const std::string reason = host.Error().empty() ? said : host.Error();
     if (!done || words.code != EXIT_CODE::Done)
-        Complain(words.code,
-                 Say("IDS_QM_CLI_FILE_ITEM", o.file, o.item) + ": " + Say(words.key) +
-                     (reason.empty() ? "" : ": " + reason));
+        Complain(words.code, Say("IDS_QM_CLI_FILE_ITEM", o.file, o.item) + ": " + Say(words.key) +
+                                 (reason.empty() ? "" : ": " + reason));
     const EXIT_CODE written = WriteResults(run, o, result, words.status);
     return words.code == EXIT_CODE::Done ? written : words.code;
 }

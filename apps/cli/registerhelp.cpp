@@ -1,7 +1,7 @@
 // The help in the user's language: what the argument parser itself says, and its labels.
 #include "qm_base/messagetext.h"
-#include "qm_rps/pushover/report/pushoverreport.h"
 #include "qm_base/nearname.h"
+#include "qm_rps/pushover/report/pushoverreport.h"
 #include "registershared.h"
 #include "registrations.h"
 

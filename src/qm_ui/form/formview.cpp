@@ -223,21 +223,13 @@ CFormField& CFormView::Add(TextFn caption, std::unique_ptr<CFormField> field, co
     return *m_fields.back();
 }
 
-ChangedFn CFormView::Changed()
+ChangedFn CFormView::Changed(bool edits)
 {
-    return [this] {
+    return [this, edits] {
         if (m_refreshing) return;
+        m_touched = m_touched || edits;
         if (m_onChange) m_onChange();
         Refresh();
-    };
-}
-
-/// The same of a field that holds a value.
-ChangedFn CFormView::Edited()
-{
-    return [this, changed = Changed()] {
-        if (!m_refreshing) m_touched = true;
-        changed();
     };
 }
 
@@ -248,18 +240,19 @@ bool CFormView::IsTouched() const
 
 CFormField& CFormView::Number(TextFn caption, T_BINDING<double> binding, TextFn unit)
 {
-    return Add(std::move(caption), MakeNumberField(std::move(binding), Edited(), this), unit);
+    return Add(std::move(caption), MakeNumberField(std::move(binding), Changed(true), this), unit);
 }
 
 CFormField& CFormView::Optional(TextFn caption, T_BINDING<std::optional<double>> binding,
                                 TextFn unit)
 {
-    return Add(std::move(caption), MakeOptionalField(std::move(binding), Edited(), this), unit);
+    return Add(std::move(caption), MakeOptionalField(std::move(binding), Changed(true), this),
+               unit);
 }
 
 CFormField& CFormView::Integer(TextFn caption, T_BINDING<int> binding, TextFn unit)
 {
-    return Add(std::move(caption), MakeIntegerField(std::move(binding), Edited(), this), unit);
+    return Add(std::move(caption), MakeIntegerField(std::move(binding), Changed(true), this), unit);
 }
 
 CFormField& CFormView::Text(TextFn caption, T_BINDING<std::string> binding)
@@ -271,19 +264,19 @@ CFormField& CFormView::Text(TextFn caption, T_BINDING<std::string> binding)
     if (!binding.set) read = nullptr;
     return Add(std::move(caption),
                MakeTextField([get = binding.get] { return QString::fromStdString(get()); },
-                             std::move(read), Edited(), this));
+                             std::move(read), Changed(true), this));
 }
 
 CFormField& CFormView::Choice(TextFn caption, T_BINDING<int> binding,
                               std::function<std::vector<std::string>()> texts)
 {
     return Add(std::move(caption),
-               MakeChoiceField(std::move(binding), std::move(texts), Edited(), this));
+               MakeChoiceField(std::move(binding), std::move(texts), Changed(true), this));
 }
 
 CFormField& CFormView::Flag(TextFn caption, T_BINDING<bool> binding)
 {
-    return Add({}, MakeFlagField(std::move(binding), std::move(caption), Edited(), this));
+    return Add({}, MakeFlagField(std::move(binding), std::move(caption), Changed(true), this));
 }
 
 CFormField& CFormView::Note(TextFn text)

@@ -57,8 +57,8 @@ public:
     /// A widget of the caller, made by it with this form (Host) as parent.
     CFormField& Custom(TextFn caption, std::unique_ptr<CFormField> field);
     QWidget* Host() { return this; }
-    /// Tells the form that the person has done something: a choice, a button.
-    ChangedFn Changed();
+    /// Tells the form that the person has done something; edits: has changed a value.
+    ChangedFn Changed(bool edits = false);
 
     /// Rules that are not kept, asked for with each refresh.
     void SetFindings(std::function<std::vector<T_FINDING>()> findings);
@@ -117,5 +117,4 @@ private:
     std::function<std::vector<T_FINDING>()> m_findings;
     bool m_refreshing = false;
     bool m_touched = false;
-    ChangedFn Edited();
 };
