@@ -19,14 +19,17 @@
 
 namespace {
 
-/// Puts a changed type back as one undoable step.
-EXIT_CODE StoreType(CDBDoc& doc, int key, T_PHGT_D& type, const std::string& out)
+/// Puts a changed type back as one undoable step, saves, and says `done`.
+EXIT_CODE StoreType(CDBDoc& doc, int key, T_PHGT_D& type, const std::string& out,
+                    const std::string& done)
 {
     for (T_HINGE_COMPONENT& component : type.components)
         component = MirroredComponent(component);
     if (!StoreHingeType(doc, key, type))
         return Complain(EXIT_CODE::BadInput, Say("IDS_QM_CLI_HINGE_NOT_STORED", doc.Path()));
-    return SaveDocument(doc, out);
+    const EXIT_CODE code = SaveDocument(doc, out);
+    if (code == EXIT_CODE::Done) PrintLine(done);
+    return code;
 }
 
 /// True where every side that the curve uses has a yield deformation to convert with.
@@ -100,8 +103,8 @@ EXIT_CODE RunHingeConvert(const T_HINGE_OPTIONS& o)
         return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_NO_SWITCH", o.file, o.type));
     if (noYield)
         return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_NO_YIELD_DEFORM", o.file, o.type));
-    PrintLine(Say("IDS_QM_CLI_HINGE_SWITCHED", std::to_string(switched)));
-    return StoreType(doc, key, type, o.out);
+    return StoreType(doc, key, type, o.out,
+                     Say("IDS_QM_CLI_HINGE_SWITCHED", std::to_string(switched)));
 }
 
 EXIT_CODE RunHingeAxial(const T_HINGE_OPTIONS& o)
@@ -132,8 +135,9 @@ EXIT_CODE RunHingeAxial(const T_HINGE_OPTIONS& o)
     fema->multiCurve = !fema->curves.empty();
     if (fema->curves.size() == 1)
         return Complain(EXIT_CODE::Usage, Say("IDS_RPS_MULTI_CURVE_COUNT"));
-    PrintLine(Say("IDS_QM_CLI_HINGE_AXIAL_FORCES", std::to_string(fema->curves.size())));
-    return StoreType(doc, key, type, o.out);
+    const std::string done =
+        Say("IDS_QM_CLI_HINGE_AXIAL_FORCES", std::to_string(fema->curves.size()));
+    return StoreType(doc, key, type, o.out, done);
 }
 
 EXIT_CODE RunHingeModelOptions(const T_HINGE_OPTIONS& o)

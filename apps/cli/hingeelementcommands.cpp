@@ -181,9 +181,10 @@ EXIT_CODE RunHingeAssign(const T_HINGE_OPTIONS& o)
     T_HINGE_REFUSAL refusal;
     if (!CHingeGenerator(doc).Generate(key, *elements, refusal))
         return Complain(EXIT_CODE::BadInput, o.file + ": " + refusal.text);
+    if (const EXIT_CODE code = SaveDocument(doc, o.out); code != EXIT_CODE::Done) return code;
     PrintLine(Say("IDS_QM_CLI_HINGE_ASSIGNED",
                   std::to_string(doc.Attr().GetElemsByPhgt(key).size()), type.name));
-    return SaveDocument(doc, o.out);
+    return EXIT_CODE::Done;
 }
 
 EXIT_CODE RunHingeGenerated(const T_HINGE_OPTIONS& o)

@@ -321,12 +321,11 @@ EXIT_CODE RunUlfCombine(const T_ULF_OPTIONS& o)
     (void)TakeMessageHistory(); // what the calculation has left
     const int made = dialog.OnMakeCombination();
     const std::vector<std::string> history = TakeMessageHistory();
-    for (const std::string& line : history) {
-        if (made)
-            std::printf("%s\n", line.c_str());
-        else
-            Complain(EXIT_CODE::Usage, line);
-    }
+    for (std::size_t i = 0; !made && i < history.size(); ++i)
+        Complain(EXIT_CODE::Usage, history[i]);
     if (!made) return EXIT_CODE::Usage;
-    return SaveDocument(in.doc, o.out.empty() ? o.file : o.out);
+    const EXIT_CODE saved = SaveDocument(in.doc, o.out.empty() ? o.file : o.out);
+    for (std::size_t i = 0; saved == EXIT_CODE::Done && i < history.size(); ++i)
+        std::printf("%s\n", history[i].c_str());
+    return saved;
 }
