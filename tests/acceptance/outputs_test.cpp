@@ -112,7 +112,7 @@ TEST_F(Outputs, AnElementListIsTakenAsWindowsTakeIt)
 {
     const auto assigned = [&](const std::string& elements) {
         const int code = Run("hinge assign @hinge-library --type 'steel beam' --elements '" +
-                             elements + "' -o a.json")
+                             elements + "' -o a.json --overwrite")
                              .code;
         return code == 0 ? Text("a.json") : std::to_string(code);
     };

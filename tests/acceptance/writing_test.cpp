@@ -57,7 +57,7 @@ TEST_F(Writing, RefusesToReplaceInputsAndWhatIsThere)
         EXPECT_TRUE(before == Files()) << row.arguments;
     }
     Done("report-data c.json --json old.txt --overwrite");
-    EXPECT_NO_THROW((void)json::parse(Text("old.txt")));
+    EXPECT_TRUE(json::accept(Text("old.txt")));
 }
 
 TEST_F(Writing, ManyAtOnceLoseNothing)
@@ -109,13 +109,14 @@ TEST_F(Writing, FollowsThePermissionsOfTheModel)
 
 TEST_F(Writing, AnIterationEndsOnASignalWithTheLoadsBefore)
 {
-    for (const char* signal : {"INT", "TERM", "HUP"}) {
-        const T_RUN run = RunShell("rm -f * && qm-rps import @cable-stayed-bridge-staged m.qmdb && "
-                                   "{ qm-rps ulf iterate m.qmdb --item STAYS --iterations 1000 "
-                                   "--tolerance 1e-300 & p=$!; while [ ! -e m_01.qmdb ]; do sleep "
-                                   "0.02; done; kill -" +
-                                       std::string(signal) + " $p; wait $p; }",
-                                   m_folder.Path());
+    // A shell has what it runs in the background ignore SIGINT.
+    for (const char* signal : {"TERM", "HUP"}) {
+        const T_RUN run =
+            RunShell("rm -f * && qm-rps import @cable-stayed-bridge-staged m.qmdb && { qm-rps ulf "
+                     "iterate m.qmdb --item STAYS --iterations 99 --tolerance 0 & p=$!; "
+                     "while [ ! -e m_01.qmdb ] && kill -0 $p; do sleep 0.02; done; kill -" +
+                         std::string(signal) + " $p; wait $p; }",
+                     m_folder.Path());
         EXPECT_EQ(1, run.code) << signal << run.err;
         ExpectHolds(run.err, {"cancelled"});
         Done("info m_01.qmdb --check");
