@@ -185,6 +185,11 @@ EXIT_CODE Store(CDBDoc& doc, const T_ANALYSE_OPTIONS& o)
 
 } // namespace
 
+EXIT_CODE ExitCodeOf(const T_ANALYSIS_ERROR& error)
+{
+    return error.fault == ANALYSIS_FAULT::NoMemory ? EXIT_CODE::NoAccess : EXIT_CODE::BadInput;
+}
+
 EXIT_CODE Analyse(CDBDoc& doc, const std::vector<int>& cases, int modes, bool noneForEmpty)
 {
     T_ANALYSIS_OPTIONS options;
@@ -198,7 +203,7 @@ EXIT_CODE Analyse(CDBDoc& doc, const std::vector<int>& cases, int modes, bool no
             std::fprintf(stderr, "%s: %s\n", doc.Path().c_str(), doc.TextOf(lost).c_str());
         return EXIT_CODE::Done;
     }
-    return Complain(EXIT_CODE::BadInput, doc.Path() + ": " + error.text);
+    return Complain(ExitCodeOf(error), doc.Path() + ": " + error.text);
 }
 
 EXIT_CODE RunAnalyse(const T_ANALYSE_OPTIONS& o)

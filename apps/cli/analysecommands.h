@@ -31,6 +31,9 @@ struct T_ANALYSE_OPTIONS {
 /// asked for, and keeps the results in a model file.
 EXIT_CODE RunAnalyse(const T_ANALYSE_OPTIONS& options);
 
+/// The code to exit with after an analysis that failed.
+EXIT_CODE ExitCodeOf(const T_ANALYSIS_ERROR& error);
+
 /// Linear analysis of these load cases (keys; empty: all, or none) and of the stages, with progress
 /// on a terminal. Done, or the code to exit with after one line on stderr.
 EXIT_CODE Analyse(CDBDoc& doc, const std::vector<int>& cases, int modes, bool noneForEmpty = false);

@@ -3,13 +3,16 @@
 #include "output.h"
 #include "qm_base/msgfunction.h"
 #include "qm_base/say.h"
+#include "qm_solver/libraryspace.h"
 #include "registrations.h"
 
 #include <CLI/CLI.hpp>
 
 #include <csignal>
 #include <cstdio>
+#include <new>
 #include <span>
+#include <stdexcept>
 #include <string_view>
 
 namespace {
@@ -32,12 +35,9 @@ void ChooseLanguage(int argc, char** argv)
     }
 }
 
-} // namespace
-
-int main(int argc, char** argv)
+/// Registers the commands and runs the one that is asked for.
+int RunCommand(int argc, char** argv)
 {
-    ChooseLanguage(argc, argv);
-    const CConsole console;
     CLI::App app{"", "qm-rps"};
     std::signal(SIGXFSZ, SIG_IGN); // a file-size limit is a write error, not the end
     EXIT_CODE code = EXIT_CODE::Done;
@@ -71,4 +71,19 @@ int main(int argc, char** argv)
         return ToInt(Complain(EXIT_CODE::NoAccess, Say("IDS_QM_CLI_NO_STDOUT")));
     }
     return ToInt(code);
+}
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    solver::StartLean(argv);
+    ChooseLanguage(argc, argv);
+    const CConsole console;
+    try {
+        return RunCommand(argc, argv);
+    } catch (const std::bad_alloc&) {
+    } catch (const std::length_error&) { // of a list that no memory could hold
+    }
+    return ToInt(Complain(EXIT_CODE::NoAccess, Say("IDS_QM_NO_MEMORY")));
 }

@@ -126,7 +126,7 @@ EXIT_CODE AnalyseStages(CDBDoc& doc, const std::string& file)
     options.allCases = false;
     T_ANALYSIS_ERROR error;
     if (doc.RunAnalysis(options, error)) return EXIT_CODE::Done;
-    return Complain(EXIT_CODE::BadInput, file + ": " + error.text);
+    return Complain(ExitCodeOf(error), file + ": " + error.text);
 }
 
 T_ULF_OUTCOME SolveUlf(CUlfItemDialog& dialog)

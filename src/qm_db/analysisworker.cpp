@@ -4,6 +4,7 @@
 
 #include <chrono>
 #include <exception>
+#include <new>
 
 CAnalysisWorker::CAnalysisWorker(JobFn job) : m_job(std::move(job)), m_thread([this] { Run(); }) {}
 
@@ -25,15 +26,18 @@ bool CAnalysisWorker::Tell(std::size_t done, std::size_t total)
 
 void CAnalysisWorker::Run()
 {
-    const auto fail = [&](const std::string& reason) {
+    const auto fail = [&](const std::string& reason,
+                          ANALYSIS_FAULT fault = ANALYSIS_FAULT::Failed) {
         m_error = {};
-        m_error.fault = ANALYSIS_FAULT::Failed;
+        m_error.fault = fault;
         m_error.text = Say("IDS_QM_ANALYSIS_FAILED", reason);
     };
     try {
         m_hasResults =
             m_job([this](std::size_t done, std::size_t total) { return Tell(done, total); },
                   m_results, m_error);
+    } catch (const std::bad_alloc&) {
+        fail(Say("IDS_QM_NO_MEMORY"), ANALYSIS_FAULT::NoMemory);
     } catch (const std::exception& fault) {
         fail(fault.what());
     } catch (...) {

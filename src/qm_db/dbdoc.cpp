@@ -167,7 +167,7 @@ int CDBDoc::StartAnalysis(T_ANALYSIS_OPTIONS options, T_ANALYSIS_ERROR& error)
     try {
         m_worker = std::make_shared<CAnalysisWorker>(std::move(job));
     } catch (const std::exception& fault) { // no thread
-        error = Failure(ANALYSIS_FAULT::Failed, fault.what());
+        error = Failure(ANALYSIS_FAULT::NoMemory, fault.what());
         return 0;
     }
     m_data.SetLocked(true);

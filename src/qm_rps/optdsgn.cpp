@@ -10,6 +10,7 @@
 #include <algorithm>
 #include <cmath>
 #include <exception>
+#include <new>
 #include <numeric>
 
 using zql::lib::MMSGFunction;
@@ -217,6 +218,8 @@ int COptDsgn::CallSolver(const T_OPT_PROBLEM& problem, T_OPT_ANSWER& answer)
     try {
         return m_solver(answer.exact ? 0 : 1, s.ncon, s.nvar, s.neq, s.matrix, s.rhs,
                         answer.factors, s.weights, problem.iobj, problem.isign, answer.code);
+    } catch (const std::bad_alloc&) {
+        throw;
     } catch (const std::exception&) {
         return 0; // the solver gave up
     } catch (...) {

@@ -192,7 +192,7 @@ TEST(AnalysisJob, WhatTheJobThrowsBecomesAnError)
     };
     const T_ROW rows[] = {
         {[](const auto&, auto&, auto&) -> int { throw std::bad_alloc(); },
-         "the analysis failed: std::bad_alloc"},
+         "the analysis failed: not enough memory"},
         {[](const auto&, auto&, auto&) -> int { throw 3; }, "the analysis failed: unknown reason"},
     };
     for (const T_ROW& row : rows) {

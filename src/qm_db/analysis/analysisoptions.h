@@ -29,6 +29,7 @@ enum class ANALYSIS_FAULT {
     NotConverged, // the modes, or the axial forces of a construction stage
     Cancelled,
     Failed, // the factorisation failed for another reason
+    NoMemory,
 };
 
 struct T_ANALYSIS_ERROR {

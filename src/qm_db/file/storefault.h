@@ -1,9 +1,11 @@
 // What the parts of the model store throw at each other; CModelStore turns it into a T_FILE_ERROR.
 #pragma once
 
+#include "qm_base/say.h"
 #include "qm_db/fileerror.h"
 
 #include <exception>
+#include <new>
 #include <string>
 #include <utility>
 
@@ -43,6 +45,8 @@ int Guarded(const std::string& path, T_FILE_ERROR& error, const F& work)
         return 1;
     } catch (const CStoreFault& fault) {
         error = fault.ForFile(path);
+    } catch (const std::bad_alloc&) {
+        error = {FILE_FAULT::NoAccess, path + ": " + Say("IDS_QM_NO_MEMORY")};
     } catch (const std::exception& fault) {
         error = {FILE_FAULT::NoAccess, path + ": " + fault.what()};
     }

@@ -9,6 +9,7 @@
 #include <algorithm>
 #include <cmath>
 #include <cstring>
+#include <new>
 
 CBlockPushResult::CBlockPushResult(std::shared_ptr<const CSqliteDb> db, std::string path,
                                    T_RESULT_HEAD head)
@@ -25,6 +26,8 @@ int CBlockPushResult::Guarded(const F& read) const
         return 1;
     } catch (const CStoreFault& fault) {
         m_error = fault.ForFile(m_path).text;
+    } catch (const std::bad_alloc&) {
+        throw; // not a fault of the results
     } catch (const std::exception& fault) {
         m_error = m_path + ": " + fault.what();
     }

@@ -9,6 +9,7 @@
 #include <algorithm>
 #include <bit>
 #include <cmath>
+#include <new>
 #include <tuple>
 
 namespace {
@@ -200,6 +201,8 @@ int CBlockStaticResult::Guarded(const F& read)
         return read() ? 1 : 0;
     } catch (const CStoreFault& fault) {
         m_error = fault.ForFile(m_path).text;
+    } catch (const std::bad_alloc&) {
+        throw; // not a fault of the results
     } catch (const std::exception& fault) {
         m_error = m_path + ": " + fault.what();
     }

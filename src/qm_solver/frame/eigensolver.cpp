@@ -5,6 +5,7 @@
 #include <algorithm>
 #include <cmath>
 #include <exception>
+#include <new>
 
 #include <Eigen/Dense>
 #include <Spectra/SymEigsSolver.h>
@@ -284,7 +285,9 @@ int SolveEigen(const T_EIGEN_PROBLEM& problem, std::size_t count, T_EIGENPAIRS& 
     } catch (const T_STOP& stop) {
         error = stop.error;
         return 0;
-    } catch (const std::exception& fault) { // out of memory, or the iteration's own complaint
+    } catch (const std::bad_alloc&) {
+        throw;
+    } catch (const std::exception& fault) { // the iteration's own complaint
         error = T_STOP(SOLVER_FAULT::Failed, fault.what()).error;
         return 0;
     }

@@ -1,10 +1,12 @@
 #include "qm_solver/sparse/mumps.h"
 
+#include "qm_solver/libraryspace.h"
 #include "qm_solver/sparse/librarylock.h"
 
 #include <algorithm>
 #include <array>
 #include <limits>
+#include <new>
 
 namespace solver {
 
@@ -21,21 +23,20 @@ struct T_ERROR_WORDS {
     const char* key;
 };
 
-constexpr std::array<T_ERROR_WORDS, 13> kErrors{{
-    {-5, "IDS_QM_ENGINE_ANALYSE_MEMORY"},
+constexpr std::array<T_ERROR_WORDS, 10> kErrors{{
     {-6, "IDS_QM_ENGINE_SINGULAR_PATTERN"},
-    {-7, "IDS_QM_ENGINE_ANALYSE_MEMORY"},
     {-8, "IDS_QM_ENGINE_FACTOR_SPACE"},
     {-9, "IDS_QM_ENGINE_FACTOR_SPACE"},
     {-10, "IDS_QM_ENGINE_SINGULAR"},
     {-11, "IDS_QM_ENGINE_FACTOR_SPACE"},
-    {-13, "IDS_QM_ENGINE_FACTOR_MEMORY"},
     {-14, "IDS_QM_ENGINE_SOLVE_SPACE"},
     {-16, "IDS_QM_ENGINE_EQUATIONS"},
     {-19, "IDS_QM_ENGINE_MEMORY_LIMIT"},
     {-51, "IDS_QM_ENGINE_TOO_LARGE"},
     {-52, "IDS_QM_ENGINE_TOO_LARGE"},
 }};
+
+constexpr std::array kNoMemory{-5, -7, -13}; // an allocation of the library failed
 
 double Count(double raw)
 {
@@ -46,6 +47,7 @@ double Count(double raw)
 
 CMumps::CMumps()
 {
+    NeedLibrarySpace();
     m_id.par = 1;
     m_id.sym = kIndefinite;
     m_id.comm_fortran = kCommWorld;
@@ -77,6 +79,7 @@ int CMumps::Run(int job)
 T_SOLVER_REASON CMumps::Words() const
 {
     const int code = Global(1);
+    if (std::ranges::find(kNoMemory, code) != kNoMemory.end()) throw std::bad_alloc();
     const auto row =
         std::find_if(kErrors.begin(), kErrors.end(), [&](const auto& r) { return r.code == code; });
     const char* key = row == kErrors.end() ? "IDS_QM_ENGINE_SPARSE_FAILED" : row->key;

@@ -6,7 +6,6 @@
 #include <algorithm>
 #include <cmath>
 #include <limits>
-#include <new>
 
 namespace solver {
 
@@ -191,7 +190,7 @@ CSparseFactor& CSparseFactor::operator=(CSparseFactor&&) noexcept = default;
 
 int CSparseFactor::Analyse(const T_SYMMETRIC_MATRIX& matrix, std::span<const int> block,
                            T_SOLVER_REASON& reason, std::shared_ptr<CFactorSpace> space)
-try {
+{
     m_state.reset();
     const std::size_t n = matrix.Size();
     if (n > static_cast<std::size_t>(std::numeric_limits<int>::max()) || !PatternIsValid(matrix) ||
@@ -209,13 +208,10 @@ try {
     }
     m_state = std::move(state);
     return 1;
-} catch (const std::bad_alloc&) {
-    reason = "IDS_QM_ENGINE_ANALYSE_MEMORY";
-    return 0;
 }
 
 int CSparseFactor::Factor(const T_SYMMETRIC_MATRIX& matrix, T_SOLVER_REASON& reason, PIVOTS pivots)
-try {
+{
     if (!m_state || !m_state->analysed || matrix.Size() != m_state->n ||
         matrix.value.size() != m_state->column.size()) {
         reason = "IDS_QM_ENGINE_OTHER_MATRIX";
@@ -228,9 +224,6 @@ try {
         return 0;
     }
     return m_state->n == 0 ? 1 : m_state->Factor(matrix, pivots, reason);
-} catch (const std::bad_alloc&) {
-    reason = "IDS_QM_ENGINE_FACTOR_MEMORY";
-    return 0;
 }
 
 int CSparseFactor::Solve(std::span<double> rhs, std::size_t count, T_SOLVER_REASON& reason)

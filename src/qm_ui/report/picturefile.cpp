@@ -1,5 +1,6 @@
 #include "qm_ui/report/picturefile.h"
 
+#include "qm_base/say.h"
 #include "qm_db/filectrl.h"
 
 #include <QBuffer>
@@ -19,6 +20,7 @@
 #include <cstdio>
 #include <exception>
 #include <memory>
+#include <new>
 #include <string_view>
 
 namespace {
@@ -183,6 +185,9 @@ int WritePictureFile(const T_DRAWING& drawing, const std::string& path, std::str
     error.clear();
     try {
         return WriteChecked(drawing, QString::fromStdString(path), error);
+    } catch (const std::bad_alloc&) {
+        error = path + ": " + Say("IDS_QM_NO_MEMORY");
+        return 0;
     } catch (const std::exception& e) {
         error = path + ": " + e.what();
         return 0;
