@@ -3,6 +3,7 @@
 #include "output.h"
 #include "qm_base/msgfunction.h"
 #include "qm_base/say.h"
+#include "qm_db/casefile.h"
 #include "qm_solver/libraryspace.h"
 #include "registrations.h"
 
@@ -43,6 +44,9 @@ int RunCommand(int argc, char** argv)
     EXIT_CODE code = EXIT_CODE::Done;
     std::string language = "en";
     AddHelp(app);
+    app.add_flag_callback(
+        "--allow-outside", [] { CCaseFile::SetAllowOutside(true); },
+        Say("IDS_QM_HELP_ALLOW_OUTSIDE"));
     app.add_option("--lang", language, Say("IDS_QM_HELP_LANG"))->check(CLI::IsMember({"en", "it"}));
     app.require_subcommand(1);
     AddModel(app, code);

@@ -5,7 +5,19 @@
 #include "qm_db/casefile/jsonparser.h"
 #include "qm_db/filectrl.h"
 
+#include <atomic>
 #include <filesystem>
+
+namespace {
+
+std::atomic<bool> g_allowOutside = false; // see SetAllowOutside()
+
+} // namespace
+
+void CCaseFile::SetAllowOutside(bool allow)
+{
+    g_allowOutside = allow;
+}
 
 int CCaseFile::Read(const std::string& path, T_MODEL_CONTENT& out, T_FILE_ERROR& error)
 {
@@ -22,7 +34,7 @@ int CCaseFile::Parse(std::string_view text, const std::string& name, const std::
     T_MODEL_CONTENT content;
     if (ParseJson(text, document, fault)) {
         CJsonReader root(&document, {}, fault);
-        ReadCase(root, folder, content);
+        ReadCase(root, {folder, g_allowOutside}, content);
     }
     if (fault.fault != FILE_FAULT::None) {
         error = {fault.fault, name + ": " + fault.text};

@@ -9,6 +9,11 @@
 
 class CCaseFile {
 public:
+    /// Whether recorder files may lie outside the folder of their case file (they may not, unless
+    /// a program says so at its start). A case file from elsewhere can't make the program read what
+    /// the person did not put beside it.
+    static void SetAllowOutside(bool allow);
+
     /// Reads a case file; values are converted from the file's units to SI. Recorder files named
     /// by "steps": {"files": ...} are read relative to the case file. 1 done; 0 error filled with
     /// one line that names file and place (`pushover[0].steps.displacement."5": ...`), `out` as it

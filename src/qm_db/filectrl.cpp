@@ -148,22 +148,33 @@ void CFileCtrl::SweepBeside(const std::string& path)
 
 int CFileCtrl::ReadWholeFile(const std::string& path, std::string& text, T_FILE_ERROR& error)
 {
-    const CScopedDescriptor file(open(path.c_str(), O_RDONLY | O_CLOEXEC));
+    // O_NONBLOCK: a pipe of that name must not hold us up
+    const CScopedDescriptor file(open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
     if (file.Get() < 0) return Refuse(path, kCantOpen, errno, error);
     struct stat info {};
     if (fstat(file.Get(), &info) != 0) return Refuse(path, kCantRead, errno, error);
+    if (S_ISDIR(info.st_mode)) return Refuse(path, kCantRead, EISDIR, error);
+    if (!S_ISREG(info.st_mode)) {
+        error = {FILE_FAULT::NoAccess, Say("IDS_QM_FILE_NOT_REGULAR", path)};
+        return 0;
+    }
 
     std::string whole;
     std::size_t used = 0;
-    const std::size_t expected = info.st_size > 0 ? static_cast<std::size_t>(info.st_size) : 0;
-    whole.resize(expected + 1); // one more: the end shows without growing
-    for (;;) {
+    const auto size = static_cast<std::size_t>(info.st_size);
+    whole.resize(std::min(size, kMostRead) + 1); // the end shows without growing
+    for (; used <= kMostRead;) {
         if (used == whole.size()) whole.resize(2 * whole.size());
         const ssize_t count = read(file.Get(), whole.data() + used, whole.size() - used);
         if (count < 0 && errno == EINTR) continue;
         if (count < 0) return Refuse(path, kCantRead, errno, error);
         if (count == 0) break;
         used += static_cast<std::size_t>(count);
+    }
+    if (used > kMostRead) {
+        error = {FILE_FAULT::BadInput,
+                 Say("IDS_QM_FILE_TOO_BIG", path, std::to_string(kMostRead >> 20))};
+        return 0;
     }
     whole.resize(used);
     text = std::move(whole);

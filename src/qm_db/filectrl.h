@@ -3,6 +3,7 @@
 
 #include "qm_db/fileerror.h"
 
+#include <cstddef>
 #include <cstdint>
 #include <span>
 #include <string>
@@ -25,6 +26,8 @@ struct T_OUTPUT {
 
 class CFileCtrl {
 public:
+    static constexpr std::size_t kMostRead = std::size_t{1} << 30; // bytes
+
     /// "/a/b/frame.v2.qmdb" gives "/a/b/frame.v2"; a path without an extension stays as it is.
     static std::string GetFilePathAndNameWithoutExtension(const std::string& path);
 
@@ -62,7 +65,8 @@ public:
     /// Removes what killed writers have left in the folder of this file.
     static void SweepBeside(const std::string& path);
 
-    /// Reads the whole file. 1 done; 0 error filled.
+    /// Reads the whole file: a regular one (no pipe, no device) of up to kMostRead bytes. 1 done;
+    /// 0 error filled.
     [[nodiscard]] static int ReadWholeFile(const std::string& path, std::string& text,
                                            T_FILE_ERROR& error);
 };

@@ -7,18 +7,24 @@
 #include "qm_db/records/inputlimits.h"
 #include "qm_db/records/recordunits.h"
 
-/// The whole document. `folder` is where relative paths of recorder files start.
-void ReadCase(CJsonReader& root, const std::string& folder, T_MODEL_CONTENT& content);
+/// Where relative paths of recorder files start, and whether they may lead out of there.
+struct T_CASE_FOLDER {
+    std::string path;
+    bool allowOutside = false;
+};
+
+/// The whole document.
+void ReadCase(CJsonReader& root, const T_CASE_FOLDER& folder, T_MODEL_CONTENT& content);
 
 class CCaseNames;
 /// What a load case has beside its own members: results of another solver, limit-state steps.
-void ReadSteps(CJsonReader& in, const CCaseNames& names, const std::string& folder, int key,
+void ReadSteps(CJsonReader& in, const CCaseNames& names, const T_CASE_FOLDER& folder, int key,
                const T_POLC_D& push, T_MODEL_CONTENT& content);
 /// References by name, and rules of the record.
 void JudgeEvaluation(CJsonReader& in, const T_MODEL& model, const T_EVAL_D& eval);
 
 /// "steps" of one load case, in SI.
-void ReadSteps(CJsonReader& steps, const std::string& folder, const T_MODEL& model,
+void ReadSteps(CJsonReader& steps, const T_CASE_FOLDER& folder, const T_MODEL& model,
                const T_POLC_D& push, T_PUSH_DATA& out);
 
 /// Calls f(CJsonReader& item, index) for each item of a table that may be left out.

@@ -62,7 +62,7 @@ void CheckKeys(CJsonReader& root)
 
 class CCaseTables {
 public:
-    CCaseTables(CJsonReader& root, const std::string& folder, T_MODEL_CONTENT& content)
+    CCaseTables(CJsonReader& root, const T_CASE_FOLDER& folder, T_MODEL_CONTENT& content)
         : m_root(root), m_folder(folder), m_content(content)
     {
     }
@@ -108,7 +108,7 @@ private:
     }
 
     CJsonReader& m_root;
-    const std::string& m_folder;
+    const T_CASE_FOLDER& m_folder;
     T_MODEL_CONTENT& m_content;
     T_MODEL& m_model = m_content.model;
     CCaseNames m_names{m_model};
@@ -116,7 +116,7 @@ private:
 
 } // namespace
 
-void ReadCase(CJsonReader& root, const std::string& folder, T_MODEL_CONTENT& content)
+void ReadCase(CJsonReader& root, const T_CASE_FOLDER& folder, T_MODEL_CONTENT& content)
 {
     CheckKeys(root);
     ReadHead(root, content.model);

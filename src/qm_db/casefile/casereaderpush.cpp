@@ -30,7 +30,7 @@ void CheckPattern(CJsonReader in, const T_MODEL& model, const T_POLC_D& push)
 
 } // namespace
 
-void ReadSteps(CJsonReader& in, const CCaseNames& names, const std::string& folder, int key,
+void ReadSteps(CJsonReader& in, const CCaseNames& names, const T_CASE_FOLDER& folder, int key,
                const T_POLC_D& push, T_MODEL_CONTENT& content)
 {
     T_MODEL& model = content.model;

@@ -29,8 +29,9 @@ public:
 /// Values in tables of another solver; a table is read once.
 class CRecorderSource : public ISeriesSource {
 public:
-    CRecorderSource(CJsonReader& files, const std::string& folder) : m_folder(folder)
+    CRecorderSource(CJsonReader& files, const T_CASE_FOLDER& folder) : m_folder(folder.path)
     {
+        m_options.allowOutside = folder.allowOutside;
         files.GetIf("skip_rows", m_options.skipRows);
         files.Check("skip_rows", m_options.skipRows >= 0, "IDS_QM_CASE_SKIP_ROWS");
         if (files.Has("decimal")) {
@@ -175,7 +176,7 @@ void ReadTables(CJsonReader& in, ISeriesSource& source, const T_MODEL& model, co
 
 } // namespace
 
-void ReadSteps(CJsonReader& steps, const std::string& folder, const T_MODEL& model,
+void ReadSteps(CJsonReader& steps, const T_CASE_FOLDER& folder, const T_MODEL& model,
                const T_POLC_D& push, T_PUSH_DATA& out)
 {
     if (!steps.Has("files")) {

@@ -32,6 +32,17 @@ std::vector<T_RECORDER_LINE> RowsOf(std::string_view text, int skip)
     return rows;
 }
 
+/// Links and ".." are followed as far as the path exists.
+bool IsInside(const std::filesystem::path& folder, const std::filesystem::path& file)
+{
+    std::error_code fault, otherFault;
+    const auto base = std::filesystem::weakly_canonical(folder.empty() ? "." : folder, fault);
+    const auto target = std::filesystem::weakly_canonical(file, otherFault);
+    if (fault || otherFault) return false;
+    const auto relative = target.lexically_relative(base);
+    return !relative.empty() && *relative.begin() != "..";
+}
+
 } // namespace
 
 int CRecorderFile::Load(const std::string& folder, const std::string& path,
@@ -39,6 +50,10 @@ int CRecorderFile::Load(const std::string& folder, const std::string& path,
 {
     std::string text;
     const std::string whole = (std::filesystem::path(folder) / path).string();
+    if (!options.allowOutside && !IsInside(folder, whole)) {
+        error = {FILE_FAULT::BadInput, Say("IDS_QM_RECORDER_OUTSIDE", path)};
+        return 0;
+    }
     if (!CFileCtrl::ReadWholeFile(whole, text, error)) return 0;
     return Parse(text, path, options, error);
 }

@@ -16,10 +16,12 @@ public:
     struct T_OPTIONS {
         int skipRows = 0;
         RECORDER_DECIMAL decimal = RECORDER_DECIMAL::Auto;
+        bool allowOutside = false; // the file may lie outside the folder
     };
-    /// Reads folder/path. The first `skipRows` lines are dropped, whatever they hold; a first row
-    /// without any number is the header. 1 done; 0 error filled (names `path`, and line and column
-    /// where the table can be read in two ways or a row is longer or shorter), nothing loaded.
+    /// Reads folder/path, a regular file in the folder or below it (links followed). The first
+    /// `skipRows` lines are dropped, whatever they hold; a first row without any number is the
+    /// header. 1 done; 0 error filled (names `path`, and line and column where the table can be
+    /// read in two ways or a row is longer or shorter), nothing loaded.
     [[nodiscard]] int Load(const std::string& folder, const std::string& path,
                            const T_OPTIONS& options, T_FILE_ERROR& error);
     /// The same from text; `name` stands for the file in messages.
