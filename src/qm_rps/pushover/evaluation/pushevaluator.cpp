@@ -165,7 +165,6 @@ int CPushEvaluator::Evaluate()
     return m_result.result;
 }
 
-// Nothing of a result stands when one of its numbers is not finite.
 void CPushEvaluator::GiveUp()
 {
     T_PUSH_EVALUATION none;
@@ -173,7 +172,6 @@ void CPushEvaluator::GiveUp()
     none.procedure = m_result.procedure;
     none.loadCase = m_result.loadCase;
     none.units = m_result.units;
-    none.gammaNote = m_result.gammaNote;
     if (none.IsTarget()) none.limitStates = CPushOverTargetEvaluation::EmptyRows(m_eval.method);
     m_result = std::move(none);
     (void)Fail(PUSH_OUTCOME::NotFinite, "IDS_QM_ADVICE_NOT_FINITE");
