@@ -17,26 +17,46 @@
 
 #include <algorithm>
 #include <cstdio>
+#include <unistd.h>
 #include <vector>
 
 namespace {
 
-/// Additional steps and spectra; false after a message on stderr.
-bool AddExtras(CPushOverCurveDlg& driver, const T_EVALUATE_OPTIONS& options)
+/// Shows how far evaluations are, where they take long and somebody looks at it.
+std::function<void(std::size_t, std::size_t)> ProgressOf(const CDBDoc& doc)
 {
+    constexpr int kManySteps = 100000; // about a tenth of a second each
+    const auto& results = doc.Data().Content().results;
+    const bool isLong = std::ranges::any_of(
+        results, [](const auto& entry) { return entry.second->StepCount() >= kManySteps; });
+    if (!isLong || !isatty(STDERR_FILENO)) return [](std::size_t, std::size_t) {};
+    return [](std::size_t done, std::size_t total) {
+        ShowOnTerminal(Say("IDS_QM_CLI_EVALUATING", std::to_string(done), std::to_string(total)),
+                       done == total);
+    };
+}
+
+/// Additional steps and spectra of the driver's evaluation. What it refuses is said on stderr and
+/// left out, the others stand; false where it refused one. `points`: some evaluation takes spectra,
+/// so that a target displacement is not blamed for taking none.
+bool AddExtras(CPushOverCurveDlg& driver, const T_EVALUATE_OPTIONS& options, bool points)
+{
+    bool all = true;
     const auto refused = [&](const std::string& what) {
-        Complain(EXIT_CODE::Usage, what + ": " + driver.Refusal().text);
-        return false;
+        const std::string name = Say("IDS_QM_CLI_EVALUATION_QUOTED", driver.Result().eval.name);
+        Complain(EXIT_CODE::Usage, name + ": " + what + ": " + driver.Refusal().text);
+        all = false;
     };
     for (const int step : options.steps) {
         if (!driver.OnPushoverCurveAddStep(step))
-            return refused(Say("IDS_QM_CLI_STEP_NUMBER", std::to_string(step)));
+            refused(Say("IDS_QM_CLI_STEP_NUMBER", std::to_string(step)));
     }
+    if (driver.Result().IsTarget() && points) return all;
     for (const std::string& spectrum : options.spectra) {
         if (!driver.CalcAdditionalPerformancePoint(spectrum))
-            return refused(Say("IDS_QM_CLI_SPECTRUM_QUOTED", spectrum));
+            refused(Say("IDS_QM_CLI_SPECTRUM_QUOTED", spectrum));
     }
-    return true;
+    return all;
 }
 
 /// Why the results of this push could not be read (a damaged block); empty when they could.
@@ -49,14 +69,23 @@ std::string ReadFault(CDBDoc& doc, const std::string& push)
     return it == results.end() ? std::string() : it->second->Error();
 }
 
-/// Evaluates what was asked for; false after a message on stderr.
+/// Evaluates what was asked for. `extras`: whether every additional step and point was listed.
 EXIT_CODE EvaluateAll(CDBDoc& doc, const T_EVALUATE_OPTIONS& options,
-                      std::vector<T_PUSH_EVALUATION>& out)
+                      std::vector<T_PUSH_EVALUATION>& out, bool& extras)
 {
     const std::string& only = options.only;
     CPushOverCurveDlg driver(doc);
+    driver.SetSpectrumShow(SPECTRUM_SHOW::Period);
+    const auto asked = [&](const T_EVAL_D& eval) { return only.empty() || eval.name == only; };
+    const bool points = std::ranges::any_of(doc.Data().Model().evaluations, [&](const auto& e) {
+        return asked(e.second) && e.second.method < PUSH_METHOD::Ec8Opcm;
+    });
+    const auto total = static_cast<std::size_t>(std::ranges::count_if(
+        doc.Data().Model().evaluations, [&](const auto& e) { return asked(e.second); }));
+    const auto progress = ProgressOf(doc);
     for (const auto& entry : doc.Data().Model().evaluations) {
-        if (!only.empty() && entry.second.name != only) continue;
+        if (!asked(entry.second)) continue;
+        progress(out.size(), total);
         T_EVAL_D eval;
         if (!doc.Attr().GetEval(entry.first, eval)) continue;
         if (!driver.SetEvaluation(eval))
@@ -66,9 +95,10 @@ EXIT_CODE EvaluateAll(CDBDoc& doc, const T_EVALUATE_OPTIONS& options,
         driver.Evaluate();
         if (const std::string fault = ReadFault(doc, eval.push); !fault.empty())
             return Complain(EXIT_CODE::BadInput, fault);
-        if (!AddExtras(driver, options)) return EXIT_CODE::Usage;
+        extras = AddExtras(driver, options, points) && extras;
         out.push_back(driver.Result());
     }
+    progress(total, total);
     if (!out.empty()) return EXIT_CODE::Done;
     if (only.empty())
         return Complain(EXIT_CODE::BadInput, doc.Path() + ": " + Say("IDS_QM_CLI_NO_EVALUATIONS"));
@@ -88,23 +118,28 @@ std::vector<T_OUTPUT> OutputsOf(const T_EVALUATE_OPTIONS& o, std::size_t count)
 {
     std::vector<T_OUTPUT> outputs{
         {o.json, OUTPUT_KIND::Json}, {o.report, OUTPUT_KIND::Text}, {o.curve, OUTPUT_KIND::Text}};
-    for (std::size_t i = 0; i < count && !o.plot.empty(); ++i)
-        outputs.push_back({NumberedPath(o.plot, i, count), OUTPUT_KIND::Picture});
+    for (const std::string& plot : {o.plot, o.plotDemand})
+        for (std::size_t i = 0; i < count && !plot.empty(); ++i)
+            outputs.push_back({NumberedPath(plot, i, count), OUTPUT_KIND::Picture});
     return outputs;
 }
 
-EXIT_CODE WritePlots(const std::string& path, const std::vector<T_PUSH_EVALUATION>& results)
+/// The pictures that were asked for, one for each evaluation.
+EXIT_CODE WritePlots(const std::string& path, const std::vector<T_PUSH_EVALUATION>& results,
+                     bool demand)
 {
 #ifdef QM_UI
     for (std::size_t i = 0; i < results.size(); ++i) {
         const std::string file = NumberedPath(path, i, results.size());
-        if (const EXIT_CODE code = WritePicture(EvaluationPlot(results[i]), file);
+        if (const EXIT_CODE code =
+                WritePicture(demand ? DemandPlot(results[i]) : EvaluationPlot(results[i]), file);
             code != EXIT_CODE::Done)
             return code;
     }
     return EXIT_CODE::Done;
 #else
     (void)results;
+    (void)demand;
     return CheckPlotName(path);
 #endif
 }
@@ -135,7 +170,8 @@ EXIT_CODE WriteResults(const T_EVALUATE_OPTIONS& o, const std::vector<T_PUSH_EVA
     if (!o.json.empty()) code = WriteOutput(o.json, ResultJson(results));
     if (ok() && !o.report.empty()) code = WriteReports(o.report, results, PushoverReportText);
     if (ok() && !o.curve.empty()) code = WriteReports(o.curve, results, PushoverCurveText);
-    if (ok() && !o.plot.empty()) code = WritePlots(o.plot, results);
+    if (ok() && !o.plot.empty()) code = WritePlots(o.plot, results, false);
+    if (ok() && !o.plotDemand.empty()) code = WritePlots(o.plotDemand, results, true);
     return code;
 }
 
@@ -153,7 +189,8 @@ EXIT_CODE RunCompare(const T_COMPARE_OPTIONS& o)
     T_PUSH_COMPARISON comparison;
     CPushEvaluator evaluator(doc, RunPerfPtProcedure);
     T_FINDING refusal;
-    if (!ComparePushover(evaluator, o.push, o.spectrum, o.behavior, comparison, refusal))
+    if (!ComparePushover(evaluator, {o.push, o.spectrum, o.behavior, ProgressOf(doc)}, comparison,
+                         refusal))
         return Complain(EXIT_CODE::Usage, o.file + ": " + refusal.text);
     if (const std::string fault = ReadFault(doc, o.push); !fault.empty())
         return Complain(EXIT_CODE::BadInput, fault);
@@ -171,7 +208,8 @@ EXIT_CODE RunCompare(const T_COMPARE_OPTIONS& o)
 
 EXIT_CODE RunEvaluate(const T_EVALUATE_OPTIONS& o)
 {
-    if (const EXIT_CODE code = CheckPlotName(o.plot); code != EXIT_CODE::Done) return code;
+    for (const std::string& plot : {o.plot, o.plotDemand})
+        if (const EXIT_CODE code = CheckPlotName(plot); code != EXIT_CODE::Done) return code;
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     const auto& evaluations = doc.Data().Model().evaluations;
@@ -180,7 +218,9 @@ EXIT_CODE RunEvaluate(const T_EVALUATE_OPTIONS& o)
         code != EXIT_CODE::Done)
         return code;
     std::vector<T_PUSH_EVALUATION> results;
-    if (const EXIT_CODE code = EvaluateAll(doc, o, results); code != EXIT_CODE::Done) return code;
+    bool extras = true;
+    if (const EXIT_CODE code = EvaluateAll(doc, o, results, extras); code != EXIT_CODE::Done)
+        return code;
     if (const EXIT_CODE code = WriteResults(o, results); code != EXIT_CODE::Done) return code;
     if (o.json != "-") std::printf("%s", ResultTable(results).c_str());
     if (o.trace && o.json != "-") {
@@ -188,6 +228,7 @@ EXIT_CODE RunEvaluate(const T_EVALUATE_OPTIONS& o)
             std::printf("%s", TraceTable(e).c_str());
     }
     if (IsModelFile(o.file) && !o.noStore && doc.Data().IsModified()) StoreSteps(doc);
+    if (!extras) return EXIT_CODE::Usage;
     for (const T_PUSH_EVALUATION& e : results) {
         if (e.Status() != kPerfPtFound && e.Status() != kPerfPtElastic) return EXIT_CODE::NotFound;
     }

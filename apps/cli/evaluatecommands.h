@@ -13,6 +13,7 @@ struct T_EVALUATE_OPTIONS {
     std::string report;               // text report
     std::string curve;                // curve table alone
     std::string plot;                 // .svg, .png or .pdf
+    std::string plotDemand;           // the demand spectrum over periods
     std::vector<int> steps;           // additional steps to list
     std::vector<std::string> spectra; // additional spectra for performance points
     bool trace = false;

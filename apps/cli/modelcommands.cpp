@@ -18,6 +18,12 @@ std::string Line(std::size_t blanks, std::string_view key, const ARGS&... args)
     return std::string(blanks, ' ') + Say(key, args...) + "\n";
 }
 
+/// A stored step; "-" where it was not found.
+std::string StepText(int step)
+{
+    return step >= 0 ? std::to_string(step) : "-";
+}
+
 /// What a document holds: title, units, counts, load cases, evaluations, stored steps.
 std::string InfoText(CDBDoc& doc)
 {
@@ -38,11 +44,9 @@ std::string InfoText(CDBDoc& doc)
                      kPatternNames[static_cast<std::size_t>(polc.patternKind)]);
         std::array<int, 3> s{};
         if (doc.Post().GetPoverInfo()->GetStepEC8(key, s))
-            text += Line(4, "IDS_QM_CLI_INFO_EC8", std::to_string(s[0]), std::to_string(s[1]),
-                         std::to_string(s[2]));
+            text += Line(4, "IDS_QM_CLI_INFO_EC8", StepText(s[0]), StepText(s[1]), StepText(s[2]));
         if (doc.Post().GetPoverInfo()->GetStepNTC2008(key, s))
-            text += Line(4, "IDS_QM_CLI_INFO_NTC", std::to_string(s[0]), std::to_string(s[1]),
-                         std::to_string(s[2]));
+            text += Line(4, "IDS_QM_CLI_INFO_NTC", StepText(s[0]), StepText(s[1]), StepText(s[2]));
     }
     for (const auto& [key, spectrum] : m.spectra)
         text += Line(2, "IDS_QM_CLI_SPECTRUM", spectrum.name);

@@ -16,6 +16,7 @@ void AddEvaluate(CLI::App& app, EXIT_CODE& code)
     sub->add_option("--report", o->report, Say("IDS_QM_HELP_EVALUATE_REPORT"));
     sub->add_option("--curve", o->curve, Say("IDS_QM_HELP_EVALUATE_CURVE"));
     sub->add_option("--plot", o->plot, Say("IDS_QM_HELP_EVALUATE_PLOT"));
+    sub->add_option("--plot-demand", o->plotDemand, Say("IDS_QM_HELP_EVALUATE_DEMAND"));
     sub->add_option("--add-step", o->steps, Say("IDS_QM_HELP_EVALUATE_STEP"));
     sub->add_option("--add-spectrum", o->spectra, Say("IDS_QM_HELP_EVALUATE_SPECTRUM"));
     sub->add_flag("--trace", o->trace, Say("IDS_QM_HELP_EVALUATE_TRACE"));

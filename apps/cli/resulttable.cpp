@@ -3,6 +3,7 @@
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/pushover/fema440coefficients.h"
+#include "qm_rps/pushover/report/pushovercells.h"
 
 namespace {
 
@@ -54,12 +55,27 @@ std::string StateLines(const T_PUSH_EVALUATION& e)
                        Say("IDS_QM_CLI_DEMAND").c_str(), step.c_str(),
                        Say("IDS_QM_CLI_CAPACITY").c_str(), step.c_str(),
                        Say("IDS_QM_CLI_REMARK").c_str());
-    for (const T_LIMIT_ROW& r : e.limitStates)
-        text +=
-            FormatText("  %-6s %12s %6s %12s %6s  %s\n", r.name.c_str(), Number(r.demand).c_str(),
-                       Step(r.demandStep).c_str(), Number(r.capacity).c_str(),
-                       Step(r.capacityStep).c_str(), r.RemarkText().c_str());
+    for (const T_LIMIT_ROW& r : e.limitStates) {
+        const auto cell = [&](const std::string& value) { return e.elastic ? "-" : value; };
+        text += FormatText("  %-6s %12s %6s %12s %6s  %s\n", r.name.c_str(),
+                           cell(Number(r.demand)).c_str(), cell(Step(r.demandStep)).c_str(),
+                           e.elastic ? kElasticText : Number(r.capacity).c_str(),
+                           cell(Step(r.capacityStep)).c_str(), r.RemarkText().c_str());
+    }
     return text;
+}
+
+/// First change of slope, T0 and the effective periods by ductility, where the method has them.
+std::string SlopeLine(const T_PUSH_EVALUATION& e)
+{
+    std::string text;
+    if (e.slopeChange)
+        text += FormatText("  %s: %.5g, %.5g;",
+                           Say("IDS_QM_UI_PUSH_SLOPE_CHANGE", NameOf(e.units.length)).c_str(),
+                           e.slopeChange->x, e.slopeChange->y);
+    for (std::size_t i = 0; i < e.teffs.size() && i < kTeffDuctilities.size(); ++i)
+        text += FormatText("  %s = %.4g s", TeffName(i).c_str(), e.teffs[i]);
+    return text.empty() ? text : text + "\n";
 }
 
 std::string AdditionalLines(const T_PUSH_EVALUATION& e, int width)
@@ -155,6 +171,8 @@ std::string ComparisonTable(const T_PUSH_COMPARISON& c)
                 Say("IDS_QM_CLI_SPREAD", std::to_string(c.count), Number(c.minD), Number(c.maxD), L,
                     Number(c.meanD), FormatText("%.3f", c.maxD / c.minD)) +
                 "\n";
+    for (const std::string& remark : RemarksOf(c))
+        text += "! " + remark + "\n";
     return text;
 }
 
@@ -163,7 +181,7 @@ std::string TraceTable(const T_PUSH_EVALUATION& e)
     std::string text =
         FormatText("\n%s: %s\n", e.eval.name.c_str(),
                    Say(e.IsTarget() ? "IDS_QM_CLI_DERIVATION" : "IDS_QM_CLI_TRIALS").c_str());
-    if (!e.IsTarget()) text += TrialLines(e);
+    if (!e.IsTarget()) text += TrialLines(e) + SlopeLine(e);
     for (std::size_t i = 0; i < e.targets.size(); ++i) {
         const T_TARGET_DISP& t = e.targets[i];
         text += FormatText("  %s T*=%s Tc=%s Se=%s ay=%s dy=%s qu=%s det*=%s dt*=%s%s\n",
@@ -172,6 +190,7 @@ std::string TraceTable(const T_PUSH_EVALUATION& e)
                            Number(t.ay).c_str(), Number(t.dy).c_str(), Number(t.qu).c_str(),
                            Number(t.det).c_str(), Number(t.dt).c_str(),
                            t.capped ? (" " + Say("IDS_QM_CLI_CAPPED")).c_str() : "");
+        if (t.found) text += "    " + TargetLine(t, e.factors.gamma) + "\n";
     }
     return text;
 }

@@ -9,11 +9,27 @@ int CPushOverAdditionalStepDlg::AddStep(int step, T_FINDING& refusal)
 {
     if (m_steps.size() >= kMaxAdditional)
         return Refuse(refusal, "step", "IDS_RPS_PUSHOVER_Maxnum_reached");
+    if (m_stepCount < 1) return Refuse(refusal, "step", "IDS_QM_NO_STEPS", {std::to_string(step)});
     if (step < 1 || step > m_stepCount)
         return Refuse(refusal, "step", "IDS_QM_NO_SUCH_STEP",
                       {std::to_string(step), std::to_string(m_stepCount)});
     if (std::ranges::find(m_steps, step) != m_steps.end())
-        return Refuse(refusal, "step", "IDS_PUSHOVER_Error___The_data_already_exist_");
+        return Refuse(refusal, "step", "IDS_QM_STEP_LISTED", {std::to_string(step)});
     m_steps.push_back(step);
     return 1;
+}
+
+int CPushOverAdditionalStepDlg::OnAdd()
+{
+    T_FINDING refusal;
+    if (AddStep(m_step, refusal)) return 1;
+    ShowMessage(refusal.messageKey, refusal.text);
+    return 0;
+}
+
+void CPushOverAdditionalStepDlg::OnRemove()
+{
+    if (m_row < 0 || m_row >= static_cast<int>(m_steps.size())) return;
+    m_steps.erase(m_steps.begin() + m_row);
+    m_row = -1;
 }

@@ -56,6 +56,14 @@ int CPushOverCalcPerfPtBase::FindInitialTrialPoint(double D1, double A1, double&
     return 1;
 }
 
+int CPushOverCalcPerfPtBase::FindFirstSlopeChange(double& D, double& A)
+{
+    m_slopeChange.reset();
+    if (!m_operations.FindFirstSlopeChange(D, A)) return 0;
+    m_slopeChange = {D, A};
+    return 1;
+}
+
 int CPushOverCalcPerfPtBase::IntersectSegmentWithCapacity(T_POINT2 P1, T_POINT2 P2,
                                                           T_POINT2& point) const
 {

@@ -42,10 +42,7 @@ public:
                                                     double& Dd, double& Ad);
 
     // Geometry and damping of the capacity spectrum: see CPerfPtOperations.
-    [[nodiscard]] virtual int FindFirstSlopeChange(double& D, double& A)
-    {
-        return m_operations.FindFirstSlopeChange(D, A);
-    }
+    [[nodiscard]] virtual int FindFirstSlopeChange(double& D, double& A);
     [[nodiscard]] virtual int CalcCapacityArea(double d, double& area)
     {
         return m_operations.CalcCapacityArea(d, area);
@@ -79,6 +76,8 @@ public:
 
     const std::vector<T_PERFPT_TRIAL>& Trace() const { return m_trace; }
     const T_OUTCOME& Outcome() const { return m_outcome; }
+    /// The first change of slope that was found; empty: there is none.
+    const std::optional<T_POINT2>& SlopeChange() const { return m_slopeChange; }
 
 protected:
     /// FEMA 440 effective period (s) and damping (per cent) for a ductility range 0 to 2; another
@@ -114,5 +113,6 @@ protected:
     int m_iteration = 0;
     std::vector<T_PERFPT_TRIAL> m_trace;
     T_OUTCOME m_outcome;
+    std::optional<T_POINT2> m_slopeChange;
     T_PERFPT_TRIAL m_last; // values of the trial being computed that helpers fill in
 };

@@ -30,6 +30,7 @@ std::optional<T_PERFPT_ANSWER> RunPerfPtProcedure(PUSH_METHOD method, int proced
     answer.result = calculator->CalcPerformancePoint(answer.Sd, answer.Sa, answer.betaEff, nullptr);
     answer.trace = calculator->Trace();
     answer.outcome = calculator->Outcome();
+    answer.slopeChange = calculator->SlopeChange();
     if (const auto* c = dynamic_cast<const CPushOverCalcPerfPtFEMA440ProcC*>(calculator.get()))
         answer.locus = c->Locus();
     return answer;

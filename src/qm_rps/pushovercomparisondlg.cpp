@@ -30,7 +30,7 @@ int CPushOverComparisonDlg::Update()
     CPushEvaluator evaluator(m_doc, RunPerfPtProcedure);
     T_FINDING refusal;
     const int done =
-        ComparePushover(evaluator, m_push, m_spectrum, m_behavior, m_comparison, refusal);
+        ComparePushover(evaluator, {m_push, m_spectrum, m_behavior, {}}, m_comparison, refusal);
     m_error = refusal.text;
     return done;
 }
@@ -62,8 +62,12 @@ std::string CPushOverComparisonDlg::SpreadText() const
     if (!m_error.empty()) return m_error;
     const T_PUSH_COMPARISON& c = m_comparison;
     if (c.count == 0) return MMSGFunction::GetValue("IDS_QM_UI_PUSH_NO_SPREAD");
-    return MMSGFunction::Format("IDS_QM_UI_PUSH_SPREAD",
-                                {std::to_string(c.count), FormatText("%.5g", c.minD),
-                                 FormatText("%.5g", c.maxD), NameOf(m_doc.Unit().Units().length),
-                                 FormatText("%.5g", c.meanD), FormatText("%.3f", c.maxD / c.minD)});
+    std::string text =
+        MMSGFunction::Format("IDS_QM_UI_PUSH_SPREAD",
+                             {std::to_string(c.count), FormatText("%.5g", c.minD),
+                              FormatText("%.5g", c.maxD), NameOf(m_doc.Unit().Units().length),
+                              FormatText("%.5g", c.meanD), FormatText("%.3f", c.maxD / c.minD)});
+    for (const std::string& remark : RemarksOf(c))
+        text += "\n! " + remark;
+    return text;
 }

@@ -23,7 +23,7 @@ public:
     const std::string& Error() const { return m_error; }
     /// One row per method.
     T_TEXT_TABLE Cells() const;
-    /// "2.1 to 3.4 in, mean 2.9, largest / smallest 1.6".
+    /// "2.1 to 3.4 in, mean 2.9, largest / smallest 1.6", and the remarks on it as further lines.
     std::string SpreadText() const;
 
     /// Says that the picture could not be written, and why.

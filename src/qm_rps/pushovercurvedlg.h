@@ -27,6 +27,8 @@ public:
 
     /// Whether limit-state steps are stored in the model (the default).
     void SetStoreSteps(bool store) { m_evaluator.SetStoreSteps(store); }
+    /// How the demand spectrum shows itself in a picture of its own.
+    void SetSpectrumShow(SPECTRUM_SHOW over) { m_evaluator.SetSpectrumShow(over); }
     /// Whether every point where demand equals capacity is looked for (the default).
     void SetFindAllPoints(bool find) { m_evaluator.SetFindAllPoints(find); }
 

@@ -6,6 +6,7 @@
 #include "qm_rps/desk/recordnames.h"
 #include "qm_rps/pushover/report/pushoverreport.h"
 #include "qm_rps/pushovercomparisondlg.h"
+#include "qm_rps/pushovercontroldlg.h"
 #include "qm_rps/pushovertextdlg.h"
 
 using zql::lib::MMSGFunction;
@@ -79,6 +80,8 @@ int CPushOverCurveEdit::Evaluate(bool storeSteps)
         return 0;
     }
     m_driver.SetStoreSteps(storeSteps);
+    m_driver.SetSpectrumShow(m_show.spectrumOver);
+    m_evaluatedShow = m_show.spectrumOver;
     m_driver.Evaluate();
     ListAgain();
     m_shown.Take(m_driver.Result());
@@ -99,7 +102,7 @@ void CPushOverCurveEdit::ListAgain()
 void CPushOverCurveEdit::OnEdited()
 {
     m_bilinearPage.DropEmpty();
-    if (m_settings != m_evaluated) Update();
+    if (m_settings != m_evaluated || m_show.spectrumOver != m_evaluatedShow) Update();
 }
 
 int CPushOverCurveEdit::OnDocumentChanged()
@@ -118,6 +121,31 @@ int CPushOverCurveEdit::OnUserDamping()
 {
     m_demandPage.SetView(View());
     if (!m_demandPage.OnUserDamping()) return 0;
+    Update();
+    return 1;
+}
+
+int CPushOverCurveEdit::OnControl()
+{
+    CPushOverControlDlg options(m_doc);
+    options.Data2Dlg(m_settings);
+    options.SetView(View());
+    if (!options.DoModal()) return 0;
+    options.Dlg2Data(m_settings);
+    Update();
+    return 1;
+}
+
+int CPushOverCurveEdit::OnSteps()
+{
+    CPushOverAdditionalStepDlg steps;
+    steps.SetStepCount(static_cast<int>(m_shown.Result().capacity.Sd.size()) - 1);
+    T_FINDING refusal; // steps that the curve has no more are left out
+    for (const int step : m_steps)
+        (void)steps.AddStep(step, refusal);
+    steps.SetView(View());
+    if (!steps.DoModal()) return 0;
+    m_steps = steps.Steps();
     Update();
     return 1;
 }
@@ -178,10 +206,12 @@ std::string CPushOverCurveEdit::StoredStepsText() const
     int key = 0;
     std::array<int, 3> s{};
     if (!m_doc.Attr().FindPolc(m_settings.push, key)) return {};
+    const auto step = [](int number) {
+        return number >= 0 ? std::to_string(number) : std::string("-");
+    };
     const auto line = [&](const char* names) {
         return MMSGFunction::Format("IDS_QM_UI_PUSH_STORED",
-                                    {names, std::to_string(s[0]) + ", " + std::to_string(s[1]) +
-                                                ", " + std::to_string(s[2])});
+                                    {names, step(s[0]) + ", " + step(s[1]) + ", " + step(s[2])});
     };
     std::string text;
     const CPoverInfo* const info = m_doc.Post().GetPoverInfo();
@@ -205,8 +235,6 @@ int CPushOverCurveEdit::OnAddStep()
 int CPushOverCurveEdit::OnAddPoint()
 {
     TakeOneOf(m_demandPage.Spectra(), m_addSpectrum);
-    if (Contains(m_points, m_addSpectrum))
-        return Say("IDS_PUSHOVER_Error___The_data_already_exist_");
     if (!Update()) return Say("IDS_QM_SETTINGS");
     const int done = m_driver.CalcAdditionalPerformancePoint(m_addSpectrum);
     if (done)

@@ -17,7 +17,8 @@
 struct T_PUSH_SHOW {
     bool guideLines = true;
     bool demandLines = true, capacityLines = true, qStarLine = true;
-    bool symbols = true; // of the trials and demand points
+    bool symbols = true;                                // of the trials and demand points
+    SPECTRUM_SHOW spectrumOver = SPECTRUM_SHOW::Period; // in the picture of the demand alone
     bool operator==(const T_PUSH_SHOW&) const = default;
 };
 
@@ -51,8 +52,11 @@ public:
     void OnEdited();
     /// To be called now and then: takes up what has changed in the document. 1 something had.
     int OnDocumentChanged();
-    /// The points of kappa in their own window. 1 taken.
+    /// The points of kappa, the control options and the additional steps in their own windows. 1
+    /// taken.
     int OnUserDamping();
+    int OnControl();
+    int OnSteps();
     /// Keeps the settings in the document under their name, as one edit; asks before it replaces
     /// another evaluation. 0 with a message: no name, settings refused, the person said no.
     [[nodiscard]] int OnStore();
@@ -101,6 +105,7 @@ private:
     CDBDoc& m_doc;
     CPushOverCurveDlg m_driver;
     CShownEvaluation m_shown;
+    SPECTRUM_SHOW m_evaluatedShow = SPECTRUM_SHOW::Displacement;
     T_EVAL_D m_evaluated; // settings of the latest evaluation, refused ones too
     std::vector<T_FINDING> m_findings;
     std::vector<int> m_steps;

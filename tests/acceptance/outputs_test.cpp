@@ -14,8 +14,9 @@ const std::string kOne = "evaluate @first-steps --only 'PX ATC-40 A'";
 TEST_F(Outputs, JsonHasTheDocumentedKeysAndNoOthers)
 {
     const std::set<std::string> kKeys{
-        "name",   "push",         "method",  "procedure", "status", "factors", "capacity",
-        "target", "limit_states", "outcome", "messages",  "trials", "trace",   "performance_point"};
+        "name",     "push",     "method", "procedure",         "status",
+        "factors",  "capacity", "target", "limit_states",      "outcome",
+        "messages", "trials",   "trace",  "performance_point", "curve"};
     const json all = Json("evaluate @first-steps");
     ASSERT_EQ(8U, all.size());
     const std::string page = ReadText(ProjectFolder() / "docs/file-formats.md");
@@ -25,6 +26,9 @@ TEST_F(Outputs, JsonHasTheDocumentedKeysAndNoOthers)
             keys.insert(item.key());
         EXPECT_EQ(r.at("trials") != 0, keys.erase("all_points") == 1) << r.at("name");
         EXPECT_EQ(r.at("trials") == 0, keys.erase("derivation") == 1) << r.at("name");
+        EXPECT_EQ(r.at("trials") == 0, keys.erase("curve_stays_elastic") == 1) << r.at("name");
+        EXPECT_EQ(r.at("trials") != 0, keys.erase("first_slope_change") == 1) << r.at("name");
+        EXPECT_EQ(r.at("trials") != 0, keys.erase("periods_by_ductility") == 1) << r.at("name");
         EXPECT_EQ(kKeys, keys) << r.at("name");
         const json flat = r.flatten();
         for (const auto& part : flat.items()) {
@@ -48,6 +52,20 @@ TEST_F(Outputs, AdditionalStepsAndSpectraStandBesideTheResult)
     EXPECT_EQ("EC8", point.at("spectrum"));
     EXPECT_EQ("found", point.at("status"));
     EXPECT_NE(a.at("performance_point").at("Sd"), point.at("performance_point").at("Sd"));
+}
+
+// Step 41 of 40 is said and left out; target displacements take no spectrum and are not blamed.
+TEST_F(Outputs, WhatIsRefusedBesideAResultLeavesTheResults)
+{
+    EXPECT_EQ(0, Run("evaluate @first-steps --add-spectrum EC8").code);
+    const T_RUN run = Run("evaluate @first-steps --add-spectrum EC8 --add-step 41 --json r.json");
+    EXPECT_EQ(2, run.code);
+    ExpectHolds(run.err, {"41", "PX NTC2018"});
+    const json results = json::parse(Text("r.json"));
+    ASSERT_EQ(8U, results.size());
+    for (const json& r : results)
+        EXPECT_EQ(r.at("trials") != 0, r.contains("additional_points")) << r.at("name");
+    EXPECT_EQ(2, Run("evaluate @first-steps --only 'PX EC8' --add-spectrum EC8").code);
 }
 
 TEST_F(Outputs, CompareListsEveryMethodWithTheSpread)

@@ -66,6 +66,7 @@ struct T_RUN {
     }
 };
 
+constexpr const char* kNoPoint = "IDS_RPS_FAILED_FINDING_PERFORMANCE_POINT";
 constexpr const char* kNoConversion = "IDS_QM_NO_CONVERSION";
 
 void OtherMode(T_MODEL& m)
@@ -212,6 +213,7 @@ TEST(PushOverCurveDlg, EveryFailureHasItsOutcomeAndMessage)
         EXPECT_EQ(f.outcome, run.R().outcome.code) << f.key;
         EXPECT_TRUE(run.Said(f.key)) << f.key;
         EXPECT_FALSE(run.R().point) << f.key;
+        EXPECT_EQ(f.method != PUSH_METHOD::Ec8Opcm, run.Said(kNoPoint)) << f.key;
         const bool target = f.method == PUSH_METHOD::Ec8Opcm; // those of an earlier one go
         EXPECT_EQ(target ? -2 : 3, run.Steps(false).back()) << f.key;
         for (const auto& m : run.R().messages)

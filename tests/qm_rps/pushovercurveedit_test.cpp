@@ -155,7 +155,7 @@ TEST(PushOverCurveEdit, AdditionalStepsAndPointsComeAgainWithEachEvaluation)
         edit->m_addStep = step;
         edit->OnAddStep();
     }
-    EXPECT_TRUE(edit.Said("IDS_PUSHOVER_Error___The_data_already_exist_"));
+    EXPECT_TRUE(edit.Said("IDS_QM_STEP_LISTED"));
     EXPECT_TRUE(edit.Said("IDS_QM_NO_SUCH_STEP"));
     edit->m_addSpectrum = "low";
     EXPECT_EQ(1, edit->OnAddPoint());

@@ -1,6 +1,7 @@
 #include "json/resultjson.h"
 
 #include "qm_rps/pushover/fema440coefficients.h"
+#include "qm_rps/pushover/report/pushovercells.h"
 
 namespace {
 
@@ -49,6 +50,7 @@ void WriteDerivation(CJsonText& w, const T_PUSH_EVALUATION& e)
         w.Member("limit_state", e.targets.size() > 1 ? kLimitStateNames[i] : "SD");
         w.Member("found", t.found);
         WriteMembers(w, t, t.Tstar > 0.0);
+        if (t.found) w.Member("line", TargetLine(t, e.factors.gamma));
         w.End();
     }
     w.End();
@@ -150,6 +152,45 @@ void WriteOutcome(CJsonText& w, const T_PUSH_EVALUATION& e)
     w.End();
 }
 
+/// First change of slope and, of ATC-40 B, the periods by ductility.
+void WriteSlope(CJsonText& w, const T_PUSH_EVALUATION& e)
+{
+    w.Key("first_slope_change");
+    if (e.slopeChange) {
+        w.Object();
+        w.Member("Sd", e.slopeChange->x).Member("Sa", e.slopeChange->y);
+        w.End();
+    } else {
+        w.Value(nullptr);
+    }
+    w.Key("periods_by_ductility").List();
+    for (std::size_t i = 0; i < e.teffs.size() && i < kTeffDuctilities.size(); ++i) {
+        w.Object();
+        w.Member("mu", kTeffDuctilities[i]).Member("T_eff", e.teffs[i]);
+        w.End();
+    }
+    w.End();
+}
+
+/// What the plotted curve reaches, and the displacements of the further nodes.
+void WriteCurve(CJsonText& w, const T_PLOTTED_CURVE& c)
+{
+    w.Key("curve").Object();
+    w.Member("plot_type", static_cast<int>(c.type));
+    w.Member("largest_displacement", c.largestX).Member("largest_force", c.largestY);
+    if (!c.monitored.empty()) {
+        w.Key("monitored").List();
+        for (const T_MONITORED_NODE& node : c.monitored) {
+            w.Object();
+            w.Member("node", node.node).Member("has_results", node.hasResults);
+            w.Items("displacement", node.x, kJsonNested);
+            w.End();
+        }
+        w.End();
+    }
+    w.End();
+}
+
 void Write(CJsonText& w, const T_PUSH_EVALUATION& e)
 {
     w.Object();
@@ -166,6 +207,11 @@ void Write(CJsonText& w, const T_PUSH_EVALUATION& e)
     WriteTarget(w, e);
     WriteLimitStates(w, e);
     WriteOutcome(w, e);
+    if (e.IsTarget())
+        w.Member("curve_stays_elastic", e.elastic);
+    else
+        WriteSlope(w, e);
+    WriteCurve(w, e.curve);
     if (!e.IsTarget()) WriteList(w, "all_points", e.allPoints);
     if (!e.additionalSteps.empty()) WriteList(w, "additional_steps", e.additionalSteps);
     if (!e.additionalPoints.empty()) WriteList(w, "additional_points", e.additionalPoints);

@@ -34,6 +34,8 @@ inline auto Numbers(const T_LIMIT_ROW& r)
     return std::tie(r.demand, r.capacity);
 }
 
+/// What stands for a capacity on a curve that stays elastic; in every language.
+inline constexpr const char* kElasticText = "Elastic";
 /// Remark of a state whose capacity rests on data that are missing.
 inline constexpr const char* kNotChecked = "not checked";
 
@@ -60,11 +62,26 @@ struct T_ADDITIONAL_POINT {
     T_OUTCOME outcome;
 };
 
+/// Displacement of a further node, in the coordinates of a plot type; 0 where it has no results.
+struct T_MONITORED_NODE {
+    int node = 0;
+    bool hasResults = false;
+    std::vector<double> x; // index = step
+};
+
+/// What a picture of the demand spectrum alone stands over; the show modes of the spectrum object.
+enum class SPECTRUM_SHOW { Displacement = 0, Period = 1 };
+
 /// A curve in the coordinates of a plot type.
 struct T_PLOTTED_CURVE {
     PLOT_TYPE type = PLOT_TYPE::Atc40;
-    std::vector<double> x, y; // index = step
+    std::vector<double> x, y;                  // index = step
+    double largestX = 0.0, largestY = 0.0;     // of its nodes and forces
+    std::vector<T_MONITORED_NODE> monitored{}; // further nodes, as the evaluation names them
 };
+
+/// Ductilities of T_PUSH_EVALUATION::teffs; 1 stands for T0.
+inline constexpr std::array<double, 5> kTeffDuctilities{1.0, 2.0, 4.0, 6.0, 8.0};
 
 struct T_PUSH_EVALUATION {
     T_EVAL_D eval; // as asked for
@@ -78,11 +95,13 @@ struct T_PUSH_EVALUATION {
     T_ADRS_CURVE capacity;                  // index = step; 0 is a tenth of step 1
     T_ADRS_CURVE demand;                    // the record at its own damping; NTC: SLV
     std::vector<T_ADRS_CURVE> stateDemands; // NTC: SLO, SLD, SLV, SLC; empty where not enabled
-    std::string gammaNote;                  // how Gamma is defined for this method
-    T_ADRS_CURVE reduced;                   // at the performance point, may be empty
+    SPECTRUM_SHOW shownOver = SPECTRUM_SHOW::Displacement; // as the spectrum is set to show itself
+    std::string gammaNote;                                 // how Gamma is defined for this method
+    T_ADRS_CURVE reduced;                                  // at the performance point, may be empty
     T_ADRS_CURVE working;      // FEMA 440: the last reduced or modified spectrum, may be empty
     T_ADRS_CURVE locus;        // ATC-40 B, FEMA 440 C: demand points, may be empty
-    std::vector<double> teffs; // ATC-40 B: T0 and Teff at ductility 2, 4, 6, 8
+    std::vector<double> teffs; // ATC-40 B: T0 and Teff at kTeffDuctilities, as far as it came
+    std::optional<T_POINT2> slopeChange; // Sd, Sa of the first change of slope, where there is one
     std::optional<T_PERF_POINT> point;
     std::vector<T_PERFPT_TRIAL> trace;
     std::vector<T_PERF_POINT> allPoints; // where demand equals capacity, in the curve's order
@@ -96,6 +115,7 @@ struct T_PUSH_EVALUATION {
     std::vector<T_GUIDE_LINE> guideLines;
 
     T_PLOTTED_CURVE curve; // the one that the report tabulates
+    bool elastic = false;  // a target displacement on a curve that never leaves its first line
     T_OUTCOME outcome;
     std::vector<zql::frx::T_MESSAGE> messages;
 

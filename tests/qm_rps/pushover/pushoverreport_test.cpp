@@ -66,6 +66,8 @@ void Elastic(EVALUATION& e)
     e.loadCase.direction = 2;
     e.loadCase.patternKind = 1;
     e.point = Point(5.0);
+    e.loadCase.controlOption = 2;
+    e.messages = {{"K", "First."}, {"IDS_RPS_FAILED_FINDING_X", "stands above"}, {"L", "Second."}};
 }
 
 void Masonry(EVALUATION& e)
@@ -84,6 +86,8 @@ void Ec8NotFoundDrift(EVALUATION& e)
     for (const char* state : {"DL", "SD", "NC"})
         e.limitStates.push_back({state, {}, {}, {}, {}, ""});
     e.curve = {PLOT_TYPE::Drift, {0.0, 0.004, 0.003}, {-0.5, 0.25, 0.125}};
+    e.curve.monitored = {{7, true, {}}, {9, false, {}}};
+    e.elastic = true;
 }
 
 void Ntc(EVALUATION& e)

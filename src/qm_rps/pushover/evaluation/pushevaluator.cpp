@@ -2,26 +2,18 @@
 
 #include "qm_base/finite.h"
 #include "qm_base/msgfunction.h"
-#include "qm_base/textformat.h"
 #include "qm_db/filectrl.h"
 #include "qm_db/recordfacts.h"
-#include "qm_rps/pushover/adrsformulas.h"
-#include "qm_rps/pushover/pushoverallpoints.h"
+#include "qm_rps/pushover/evaluation/pushremarks.h"
 #include "qm_rps/pushover/refusal.h"
 
 #include <algorithm>
-#include <cmath>
 
 using zql::lib::MMSGFunction;
 
 namespace {
 
-/// How Gamma is defined: by the mode as recorded, from the nodal masses, or for NTC.
-const char* GammaKey(const T_EVAL_D& eval, const T_PUSH_FACTORS& factors)
-{
-    if (eval.method >= PUSH_METHOD::Ntc2008) return "IDS_RPS_PO_CURVE_GAMMA_NTC";
-    return factors.eigenBased ? "IDS_RPS_PO_CURVE_GAMMA_FEMA" : "IDS_RPS_PO_CURVE_GAMMA_2D_FEMA";
-}
+constexpr const char* kNoPoint = "IDS_RPS_FAILED_FINDING_PERFORMANCE_POINT";
 
 T_DAMP_PARAM DampingOf(const T_EVAL_D& evaluation)
 {
@@ -96,6 +88,9 @@ T_PUSH_CURVE_SETTINGS CPushEvaluator::CurveSettings(PLOT_TYPE type) const
     settings.plotType = type;
     settings.eigenFactors = m_eval.eigenFactors.value_or(true);
     settings.gravity = FindGravity(true);
+    settings.userWeight = m_eval.weight.value_or(0.0);
+    for (std::size_t i = 0; i < m_eval.monitoredNodes.size(); ++i)
+        settings.extraNodes.at(i) = m_eval.monitoredNodes[i];
     return settings;
 }
 
@@ -124,6 +119,13 @@ int CPushEvaluator::CalcPushoverCurve()
 
 // What makes a capacity spectrum impossible.
 int CPushEvaluator::CheckCurve()
+{
+    if (IsUsable()) return 1;
+    if (!m_result.IsTarget()) Say(kNoPoint);
+    return 0;
+}
+
+int CPushEvaluator::IsUsable()
 {
     if (m_curve.PlotType() != MethodPlotType())
         return Fail(PUSH_OUTCOME::ConversionFailed, "IDS_QM_VERTICAL_PUSH");
@@ -161,7 +163,10 @@ int CPushEvaluator::Evaluate()
     else
         ForgetSteps();
     FillResult();
-    if (!IsFinite(m_result)) GiveUp();
+    if (IsFinite(m_result))
+        AddRemarks(m_doc, m_spectrumRecord, m_result);
+    else
+        GiveUp();
     return m_result.result;
 }
 
@@ -183,10 +188,17 @@ void CPushEvaluator::PrepareSpectrum()
 {
     const int behavior = Damping().behaviorType;
     const double gravity = GetGravity(1);
-    if (m_spectrumMade == m_spectrumRecord && m_spectrumBehavior == behavior &&
+    const bool shown =
+        !DesignSpectrum() || DesignSpectrum()->GetShowMode() == static_cast<int>(m_spectrumShow);
+    if (shown && m_spectrumMade == m_spectrumRecord && m_spectrumBehavior == behavior &&
         m_spectrumGravity == gravity)
         return;
-    SetDesignSpectrum(MakeDesignSpectrum(m_spectrumRecord, behavior, LIMIT_STATE::SLV));
+    auto spectrum = MakeDesignSpectrum(m_spectrumRecord, behavior, LIMIT_STATE::SLV);
+    if (spectrum) {
+        spectrum->SetCurrentDlg(static_cast<int>(m_eval.method));
+        spectrum->SetShowMode(static_cast<int>(m_spectrumShow));
+    }
+    SetDesignSpectrum(std::move(spectrum));
     m_spectrumMade = m_spectrumRecord;
     m_spectrumBehavior = behavior;
     m_spectrumGravity = gravity;
@@ -194,61 +206,26 @@ void CPushEvaluator::PrepareSpectrum()
 
 int CPushEvaluator::UpdatePerformancePoint()
 {
-    const char* const failed = "IDS_RPS_FAILED_FINDING_PERFORMANCE_POINT";
-    if (!DesignSpectrum()) return Fail(PUSH_OUTCOME::NoTrialPoint, failed);
+    if (!DesignSpectrum()) return Fail(PUSH_OUTCOME::NoTrialPoint, kNoPoint);
     const std::string& path = m_doc.Path();
     SetModelPath(path.empty() ? path : CFileCtrl::GetFilePathAndNameWithoutExtension(path));
     if (m_eval.method == PUSH_METHOD::Atc40 && Damping().behaviorType == kUserBehavior &&
         !m_eval.userDamping)
         Say("IDS_QM_WARN_NO_USER_DAMPING");
     auto answer = m_procedure(m_eval.method, m_result.procedure - 'A', *this);
-    if (!answer) return Fail(PUSH_OUTCOME::NoCapacity, failed);
+    if (!answer) return Fail(PUSH_OUTCOME::NoCapacity, kNoPoint);
     for (const std::string& key : Warnings())
         Say(key.c_str());
     m_result.trace = std::move(answer->trace);
     m_result.locus = std::move(answer->locus);
+    m_result.slopeChange = answer->slopeChange;
     m_result.outcome = answer->outcome;
     if (answer->result == 0)
-        Say(failed);
+        Say(kNoPoint);
     else
         m_result.point = MakePoint(answer->Sd, answer->Sa, answer->betaEff);
     if (m_findAllPoints) KeepAllPoints();
     return answer->result;
-}
-
-T_PERF_POINT CPushEvaluator::MakePoint(double Dp, double Ap, std::optional<double> beta) const
-{
-    T_PERF_POINT p;
-    p.Sd = p.D = Dp;
-    p.Sa = p.V = Ap;
-    TransferToDispAndReac(&p.D, &p.V);
-    p.Teff = SecantPeriod(Dp, Ap, GetGravity(1));
-    p.damping = beta;
-    return p;
-}
-
-// The procedure's answer stays as it is; the note says how it lies to the balanced points.
-void CPushEvaluator::KeepAllPoints()
-{
-    constexpr double kAway = 0.02; // of the point's displacement
-    const bool fema440 = m_eval.method == PUSH_METHOD::Fema440;
-    for (const T_BALANCED_POINT& b : CPushOverAllPoints(*this, fema440).Find())
-        m_result.allPoints.push_back(MakePoint(b.Sd, b.Sa, b.betaEff));
-    if (m_result.allPoints.empty()) return;
-    if (!m_result.point) {
-        m_result.pointNote = MMSGFunction::Format(
-            "IDS_QM_POINT_EXISTS", {std::to_string(m_result.allPoints.size()),
-                                    FormatText("%.6g", m_result.allPoints.front().D)});
-        return;
-    }
-    const double D = m_result.point->D;
-    const auto nearest = std::ranges::min_element(
-        m_result.allPoints, {}, [D](const T_PERF_POINT& p) { return std::fabs(p.D - D); });
-    const double away = std::fabs(nearest->D - D) / nearest->D;
-    if (away > kAway)
-        m_result.pointNote =
-            MMSGFunction::Format("IDS_QM_POINT_AWAY", {FormatText("%.2g", 100.0 * away),
-                                                       FormatText("%.6g", nearest->D)});
 }
 
 T_TARGET_INPUT CPushEvaluator::TargetInput(CStepDrift& drift) const
@@ -313,58 +290,6 @@ void CPushEvaluator::ForgetSteps()
         StoreSteps(std::vector<int>(m_result.limitStates.size(), kStepNone));
 }
 
-void CPushEvaluator::FillResult()
-{
-    m_result.loadCase = m_curve.LoadCase();
-    m_result.factors = m_curve.Factors();
-    if (m_result.factors.gamma != 0.0)
-        m_result.mStar = m_result.factors.mass * m_result.factors.alpha / m_result.factors.gamma;
-    m_result.capacity = Capacity();
-    m_result.demand = Demand();
-    m_result.reduced = PerfPointSpectrum();
-    m_result.working = WorkingDemand();
-    if (m_result.locus.Sd.empty()) m_result.locus = PerfPointTrace();
-    m_result.gammaNote = MMSGFunction::GetValue(GammaKey(m_eval, m_result.factors));
-    KeepStateDemands();
-    m_result.teffs = Teffs();
-    PlotCurve();
-}
-
-// NTC: one spectrum for each enabled limit state, for the picture.
-void CPushEvaluator::KeepStateDemands()
-{
-    if (m_eval.method < PUSH_METHOD::Ntc2008 ||
-        !std::holds_alternative<T_SPFC_NTC>(m_spectrumRecord.data))
-        return;
-    m_result.stateDemands.resize(kLimitStateNames.size());
-    std::vector<double> T;
-    for (std::size_t i = 0; i < kLimitStateNames.size(); ++i) {
-        const auto spectrum = MakeDesignSpectrum(m_spectrumRecord, Damping().behaviorType,
-                                                 static_cast<LIMIT_STATE>(i));
-        if (!spectrum) continue;
-        T_ADRS_CURVE& curve = m_result.stateDemands[i];
-        spectrum->CalcPOSpectrumSRaSRv(1.0, 1.0, T, curve.Sa);
-        ToAdrs(T, curve.Sa, curve.Sd);
-    }
-}
-
-// The curve that the report tabulates: the method's own, or of the plot type asked for.
-void CPushEvaluator::PlotCurve()
-{
-    const auto type =
-        static_cast<PLOT_TYPE>(m_eval.plotType.value_or(static_cast<int>(m_eval.method)));
-    if (type == MethodPlotType()) {
-        if (m_curveMade)
-            m_result.curve = {m_curve.PlotType(), m_curve.Displacement(), m_curve.Force()};
-        return;
-    }
-    CPushOverCurveData data(m_doc);
-    const bool shear = type == PLOT_TYPE::ShearCoeff || type == PLOT_TYPE::Drift;
-    const int made = data.Calc(CurveSettings(type));
-    if (made && shear && data.Factors().weight == 0.0) Say("IDS_QM_WARN_NO_WEIGHT");
-    if (made) m_result.curve = {data.PlotType(), data.Displacement(), data.Force()};
-}
-
 bool CPushEvaluator::ExistEC8OrMasonry() const
 {
     const auto isMasonry = [](const auto& entry) { return entry.second.masonry.has_value(); };
@@ -375,6 +300,9 @@ int CPushEvaluator::CalcAdditionalPerformancePoint(const std::string& spectrum, 
 {
     if (m_result.additionalPoints.size() >= kMaxAdditional)
         return Refuse(refusal, "", "IDS_RPS_PUSHOVER_Maxnum_reached");
+    const auto listed = [&](const T_ADDITIONAL_POINT& p) { return p.spectrum == spectrum; };
+    if (std::ranges::any_of(m_result.additionalPoints, listed))
+        return Refuse(refusal, "", "IDS_QM_POINT_LISTED", {spectrum});
     if (m_result.IsTarget()) return Refuse(refusal, "", "IDS_QM_NO_ADDITIONAL_POINT");
     CPushEvaluator other(m_doc, m_procedure);
     other.SetFindAllPoints(false);

@@ -18,7 +18,8 @@ struct T_PERFPT_ANSWER {
     double Sd = 0.0, Sa = 0.0;
     std::optional<double> betaEff; // per cent, where the procedure sets one
     std::vector<T_PERFPT_TRIAL> trace;
-    T_ADRS_CURVE locus; // demand points, where the procedure has them itself
+    std::optional<T_POINT2> slopeChange; // the first on the capacity spectrum
+    T_ADRS_CURVE locus;                  // demand points, where the procedure has them itself
     T_OUTCOME outcome;
 };
 
@@ -43,6 +44,8 @@ public:
 
     /// Whether limit-state steps are stored in the model (the default).
     void SetStoreSteps(bool store) { m_storeSteps = store; }
+    /// How the demand spectrum shows itself; Displacement is the default.
+    void SetSpectrumShow(SPECTRUM_SHOW over) { m_spectrumShow = over; }
     /// Whether every point where demand equals capacity is looked for (the default).
     void SetFindAllPoints(bool find) { m_findAllPoints = find; }
 
@@ -82,10 +85,12 @@ private:
     void PrepareSpectrum();
     void KeepStateDemands();
     int CheckCurve();
+    int IsUsable();
     void WarnAboutCurve();
     void FillResult();
     void GiveUp();
     void PlotCurve();
+    void TakePlot(const CPushOverCurveData& data);
     void Say(const char* key, std::initializer_list<std::string_view> values = {});
     int Fail(PUSH_OUTCOME code, const char* key);
     PLOT_TYPE MethodPlotType() const { return static_cast<PLOT_TYPE>(m_eval.method); }
@@ -105,5 +110,6 @@ private:
     std::optional<T_SPFC_D> m_spectrumMade;
     int m_spectrumBehavior = -1;
     double m_spectrumGravity = 0.0;
+    SPECTRUM_SHOW m_spectrumShow = SPECTRUM_SHOW::Displacement;
     T_PUSH_EVALUATION m_result;
 };

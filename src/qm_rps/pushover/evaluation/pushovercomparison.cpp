@@ -75,24 +75,35 @@ void CalcSpread(T_PUSH_COMPARISON& c)
 
 } // namespace
 
-int ComparePushover(CPushEvaluator& evaluator, const std::string& push, const std::string& spectrum,
-                    int behavior, T_PUSH_COMPARISON& out, T_FINDING& refusal)
+std::vector<std::string> RemarksOf(const T_PUSH_COMPARISON& comparison)
+{
+    std::vector<std::string> texts;
+    for (const T_PUSH_EVALUATION& e : comparison.results)
+        for (const auto& m : e.messages)
+            if (std::ranges::find(texts, m.text) == texts.end()) texts.push_back(m.text);
+    return texts;
+}
+
+int ComparePushover(CPushEvaluator& evaluator, const T_COMPARISON_CASE& asked,
+                    T_PUSH_COMPARISON& out, T_FINDING& refusal)
 {
     T_PUSH_COMPARISON c;
     evaluator.SetStoreSteps(false);
     for (const T_METHOD_ROW& method : kMethods) {
         T_EVAL_D eval;
         eval.name = method.label;
-        eval.push = push;
-        eval.spectrum = spectrum;
+        eval.push = asked.push;
+        eval.spectrum = asked.spectrum;
         eval.method = method.method;
         eval.procedure = method.procedure;
-        eval.behavior = behavior;
+        eval.behavior = asked.behavior;
+        if (asked.progress) asked.progress(c.rows.size(), kMethods.size());
         if (!evaluator.SetEvaluation(eval, refusal)) return 0;
         evaluator.Evaluate();
         c.rows.push_back(RowOf(method, evaluator.Result(), evaluator));
         c.results.push_back(evaluator.Result());
     }
+    if (asked.progress) asked.progress(kMethods.size(), kMethods.size());
     CalcSpread(c);
     out = std::move(c);
     return 1;

@@ -18,10 +18,19 @@ struct T_PUSH_COMPARISON {
     double minD = 0.0, maxD = 0.0, meanD = 0.0; // over those rows
 };
 
+/// The messages of all results, each text once, in their order.
+std::vector<std::string> RemarksOf(const T_PUSH_COMPARISON& comparison);
+
+/// What is compared.
+struct T_COMPARISON_CASE {
+    std::string push, spectrum; // names
+    int behavior = 0;           // 0 to 2
+    /// Called before each method and after the last. Empty: nobody is told.
+    std::function<void(std::size_t done, std::size_t total)> progress{};
+};
+
 /// ATC-40 A and B, FEMA 440 A, B and C, Eurocode 8 (SD) and NTC 2008 and 2018 (SLV), with their
-/// defaults and the given behaviour type (0 to 2). The evaluator no longer stores steps: the model
-/// is not changed. 1 done; 0 there is no such load case or spectrum (refusal says which), output as
-/// it was.
-[[nodiscard]] int ComparePushover(CPushEvaluator& evaluator, const std::string& push,
-                                  const std::string& spectrum, int behavior, T_PUSH_COMPARISON& out,
-                                  T_FINDING& refusal);
+/// defaults. The evaluator no longer stores steps: the model is not changed. 1 done; 0 there is no
+/// such load case or spectrum (refusal says which), output as it was.
+[[nodiscard]] int ComparePushover(CPushEvaluator& evaluator, const T_COMPARISON_CASE& asked,
+                                  T_PUSH_COMPARISON& out, T_FINDING& refusal);

@@ -45,6 +45,11 @@ void AddPointCells(const T_PUSH_EVALUATION& e, T_TEXT_TABLE& t)
         {"D (" + L + "), V (" + F + ")", PerfPointPair(e, &T_PERF_POINT::D, &T_PERF_POINT::V)});
     t.rows.push_back({"Teff (s)", value([](const T_PERF_POINT& p) { return p.Teff; })});
     t.rows.push_back({"Deff (%)", value([](const T_PERF_POINT& p) { return p.damping; })});
+    if (e.slopeChange)
+        t.rows.push_back({MMSGFunction::Format("IDS_QM_UI_PUSH_SLOPE_CHANGE", {L}),
+                          FormatText("%.6g, %.6g", e.slopeChange->x, e.slopeChange->y)});
+    for (std::size_t i = 0; i < e.teffs.size() && i < kTeffDuctilities.size(); ++i)
+        t.rows.push_back({TeffName(i) + " (s)", Number(e.teffs[i])});
     t.rows.push_back(
         {MMSGFunction::GetValue("IDS_QM_UI_PUSH_TRIALS"), std::to_string(e.trace.size())});
 }
@@ -55,6 +60,9 @@ void AddTargetCells(const T_PUSH_EVALUATION& e, T_TEXT_TABLE& t)
     for (std::size_t i = 0; i < e.targets.size(); ++i) {
         const T_TARGET_DISP& d = e.targets[i];
         const std::string state = e.targets.size() > 1 ? kLimitStateNames[i] : "SD";
+        if (d.found)
+            t.rows.push_back({state + ": " + MMSGFunction::GetValue("IDS_QM_UI_PUSH_DERIVATION"),
+                              TargetLine(d, e.factors.gamma)});
         const auto add = [&](const std::string& name, const std::optional<double>& v) {
             t.rows.push_back({state + ": " + name, d.found ? Number(v) : "-"});
         };
@@ -77,6 +85,21 @@ T_TEXT_COLUMN Column(std::string head)
 
 } // namespace
 
+std::string TeffName(std::size_t i)
+{
+    return i == 0 ? "T0" : FormatText("Teff(mu=%g)", kTeffDuctilities[i]);
+}
+
+std::string TargetLine(const T_TARGET_DISP& t, double gamma)
+{
+    if (!t.qu)
+        return FormatText("(Long) det* = dt* = %g, Gamma = %g, Se(T*) = %g, T* = %g", t.dt, gamma,
+                          t.Se, t.Tstar);
+    // the blank before the second comma is meant
+    return FormatText("(Short) T* = %g, Se(T*) = %g , det* = %g, dt* = %g, Gamma = %g", t.Tstar,
+                      t.Se, t.det, t.dt, gamma);
+}
+
 std::string PerfPointPair(const T_PUSH_EVALUATION& e, double T_PERF_POINT::*first,
                           double T_PERF_POINT::*second)
 {
@@ -95,6 +118,12 @@ T_TEXT_TABLE PushoverResultCells(const T_PUSH_EVALUATION& e)
         AddTargetCells(e, t);
     else
         AddPointCells(e, t);
+    if (!e.curve.x.empty()) {
+        t.rows.push_back(
+            {MMSGFunction::GetValue("IDS_QM_UI_PUSH_LARGEST_X"), Number(e.curve.largestX)});
+        t.rows.push_back(
+            {MMSGFunction::GetValue("IDS_QM_UI_PUSH_LARGEST_Y"), Number(e.curve.largestY)});
+    }
     t.rows.push_back({"Gamma", Number(e.factors.gamma)});
     t.rows.push_back({"alpha", Number(e.factors.alpha)});
     const std::string mass = std::string(Force(e.units)) + " s2/" + std::string(Length(e.units));
@@ -112,9 +141,13 @@ T_TEXT_TABLE PushoverStateCells(const T_PUSH_EVALUATION& e)
                     Column(MMSGFunction::GetValue("IDS_QM_UI_PUSH_STEP")),
                     {MMSGFunction::GetValue("IDS_QM_UI_PUSH_REMARK")}},
                    {}};
-    for (const T_LIMIT_ROW& r : e.limitStates)
-        t.rows.push_back({r.name, Number(r.demand), Step(r.demandStep), Number(r.capacity),
-                          Step(r.capacityStep), r.RemarkText()});
+    for (const T_LIMIT_ROW& r : e.limitStates) {
+        if (e.elastic)
+            t.rows.push_back({r.name, "-", "-", kElasticText, "-", r.RemarkText()});
+        else
+            t.rows.push_back({r.name, Number(r.demand), Step(r.demandStep), Number(r.capacity),
+                              Step(r.capacityStep), r.RemarkText()});
+    }
     return t;
 }
 
@@ -150,8 +183,15 @@ T_TEXT_TABLE PushoverCurveCells(const T_PUSH_EVALUATION& e)
 {
     T_TEXT_TABLE t{
         {Column(PlotXTitle(e.curve.type, e.units)), Column(PlotYTitle(e.curve.type, e.units))}, {}};
-    for (std::size_t i = 0; i < e.curve.x.size(); ++i)
-        t.rows.push_back({Number(e.curve.x[i]), Number(e.curve.y[i])});
+    for (const T_MONITORED_NODE& node : e.curve.monitored)
+        t.columns.push_back(Column(
+            MMSGFunction::Format("IDS_QM_UI_PUSH_NODE_COLUMN", {std::to_string(node.node)})));
+    for (std::size_t i = 0; i < e.curve.x.size(); ++i) {
+        ROW row{Number(e.curve.x[i]), Number(e.curve.y[i])};
+        for (const T_MONITORED_NODE& node : e.curve.monitored)
+            row.push_back(node.hasResults ? Number(node.x[i]) : "-");
+        t.rows.push_back(std::move(row));
+    }
     return t;
 }
 
@@ -186,6 +226,15 @@ T_TEXT_TABLE AdditionalPointCells(const T_PUSH_EVALUATION& e)
                           OutcomeName(p.outcome)});
     }
     return t;
+}
+
+std::string RemarkLine(const T_PUSH_EVALUATION& e)
+{
+    if (e.messages.empty()) return {};
+    const std::string& first = e.messages.front().text;
+    if (e.messages.size() == 1) return first;
+    return MMSGFunction::Format("IDS_QM_UI_PUSH_MORE_REMARKS",
+                                {first, std::to_string(e.messages.size() - 1)});
 }
 
 std::string OutcomeLines(const T_PUSH_EVALUATION& e)

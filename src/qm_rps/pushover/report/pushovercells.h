@@ -10,6 +10,11 @@
 std::string PerfPointPair(const T_PUSH_EVALUATION& e, double T_PERF_POINT::*first,
                           double T_PERF_POINT::*second);
 
+/// "T0", "Teff(mu=2)": names of T_PUSH_EVALUATION::teffs.
+std::string TeffName(std::size_t i);
+/// "(Long) det* = dt* = ..." or "(Short) T* = ...": how a found target displacement came about.
+std::string TargetLine(const T_TARGET_DISP& target, double gamma);
+
 /// Name and value: the point or the derivation of each target, the factors.
 T_TEXT_TABLE PushoverResultCells(const T_PUSH_EVALUATION& e);
 /// Limit states: demand, capacity, their steps, remark.
@@ -21,6 +26,8 @@ T_TEXT_TABLE PushoverCurveCells(const T_PUSH_EVALUATION& e);
 T_TEXT_TABLE AdditionalStepCells(const T_PUSH_EVALUATION& e);
 T_TEXT_TABLE AdditionalPointCells(const T_PUSH_EVALUATION& e);
 
+/// The first message of a result and how many more there are; empty: none.
+std::string RemarkLine(const T_PUSH_EVALUATION& e);
 /// Name of the outcome, its advice, what the balanced points add, and the messages, as lines.
 std::string OutcomeLines(const T_PUSH_EVALUATION& e);
 

@@ -39,6 +39,8 @@ constexpr std::array<std::array<const char*, 2>, 9> kAxisKeys{{
     {kSd, kSa},
 }};
 
+constexpr const char* kNotMet = "N/A";
+
 std::string DispText(const std::optional<double>& v)
 {
     return v ? FormatText("%f", *v) : "-";
@@ -86,11 +88,12 @@ std::string PerfPointSection(const T_PUSH_EVALUATION& e)
 }
 
 /// A row of the limit-state lines; NTC shows "NG" in the window and "N/A" in the file.
-std::string StateLine(const T_LIMIT_ROW& r)
+std::string StateLine(const T_LIMIT_ROW& r, bool elastic)
 {
-    const std::string remark = r.remark == "NG" ? "N/A" : r.RemarkText();
+    const std::string remark = r.remark == "NG" ? kNotMet : r.RemarkText();
     return FormatText("* %s- Demand, Capacity, Step, Remark : %s, %s, %s, %s \n", r.name.c_str(),
-                      DispText(r.demand).c_str(), DispText(r.capacity).c_str(),
+                      DispText(r.demand).c_str(),
+                      elastic ? kElasticText : DispText(r.capacity).c_str(),
                       StepText(r.demandStep).c_str(), remark.c_str());
 }
 
@@ -117,7 +120,7 @@ std::string Ec8Section(const T_PUSH_EVALUATION& e)
 {
     std::string s = Head(e, "[ Target Displacement ]\n");
     for (std::size_t i = 0; i < e.limitStates.size() && i < 3; ++i)
-        s += StateLine(e.limitStates[i]);
+        s += StateLine(e.limitStates[i], e.elastic);
     if (e.limitStates.size() > 3)
         s += FormatText("* q*- Displacement,     Step         : %s, %s \n",
                         DispText(e.limitStates[3].capacity).c_str(),
@@ -135,7 +138,7 @@ std::string NtcSection(const T_PUSH_EVALUATION& e)
 {
     std::string s = Head(e, "[ Target Displacement ]\n");
     for (const T_LIMIT_ROW& row : e.limitStates)
-        s += StateLine(row);
+        s += StateLine(row, e.elastic);
     s += kLine;
     if (e.targets.empty()) return s + FailedTarget() + kLine;
     for (std::size_t i = 0; i < e.targets.size(); ++i) {
@@ -176,6 +179,34 @@ std::string Extreme(const char* key, const T_PLOTTED_CURVE& c, std::size_t i)
     return MMSGFunction::Format(key, {FormatText("%20.5e", c.y[i]), FormatText("%20.5e", c.x[i])});
 }
 
+/// Behind the control node: how it came about, and the further nodes that are followed.
+std::string NodeNote(const T_PUSH_EVALUATION& e)
+{
+    std::string note, nodes;
+    if (e.loadCase.controlOption != kNamedControlNode)
+        note = "( " + MMSGFunction::GetValue("IDS_QM_REPORT_NODE_FOUND") + " ) ";
+    for (const T_MONITORED_NODE& node : e.curve.monitored)
+        nodes += (nodes.empty() ? "" : ", ") + std::to_string(node.node);
+    if (!nodes.empty())
+        note += "( " + MMSGFunction::Format("IDS_QM_REPORT_FURTHER", {nodes}) + " )";
+    return note;
+}
+
+/// What the numbers above rest on: the messages that no section has printed.
+std::string RemarkSection(const T_PUSH_EVALUATION& e)
+{
+    std::string s;
+    const auto isNotMet = [](const T_LIMIT_ROW& r) {
+        return r.remark == kNotMet || r.remark == "NG";
+    };
+    if (std::ranges::any_of(e.limitStates, isNotMet))
+        s += "* " + MMSGFunction::GetValue("IDS_QM_REPORT_NOT_MET") + "\n";
+    for (const auto& m : e.messages)
+        if (!m.key.starts_with("IDS_RPS_FAILED_FINDING")) s += "* " + m.text + "\n";
+    if (s.empty()) return s;
+    return "[ " + MMSGFunction::GetValue("IDS_QM_REPORT_REMARKS") + " ]\n" + s + "\n\n";
+}
+
 std::string TableHead(const T_PUSH_EVALUATION& e, const std::string& x, const std::string& y)
 {
     const T_POLC_D& polc = e.loadCase;
@@ -185,7 +216,7 @@ std::string TableHead(const T_PUSH_EVALUATION& e, const std::string& x, const st
     if (polc.patternKind >= 2)
         s += MMSGFunction::Format("IDS_PUSHOVER_Mode__d", {std::to_string(e.factors.mode)}) + "\n";
     s += MMSGFunction::Format("IDS_RPS_PUSHOVER__Node____d___Direction____s____s_n",
-                              {std::to_string(polc.controlNode), Direction(polc), ""});
+                              {std::to_string(polc.controlNode), Direction(polc), NodeNote(e)});
     return s;
 }
 
@@ -255,7 +286,7 @@ std::string PushoverReportText(const T_PUSH_EVALUATION& e)
         s += Ec8Section(e);
     else
         s += NtcSection(e);
-    return s + PushoverCurveText(e);
+    return s + PushoverCurveText(e) + RemarkSection(e);
 }
 
 int WritePushoverText(const std::string& text, const std::string& path, std::string& error)
