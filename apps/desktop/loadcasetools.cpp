@@ -8,12 +8,14 @@
 #include "qm_rps/po_femastrlossfigureedlg.h"
 #include "qm_rps/po_femaunloadstifffigureedlg.h"
 #include "qm_rps/po_hingeskcvtabfemaaxialdlg.h"
+#include "qm_rps/po_inelastichingedlg.h"
 #include "qm_rps/po_loadcasedlg.h"
 #include "qm_rps/po_loadcaselistdlg.h"
 #include "qm_rps/po_selectloadcasedlg.h"
 #include "qm_rps/rps_main.h"
 #include "qm_ui/form/dialogwindow.h"
 #include "qm_ui/hinge/figureview.h"
+#include "qm_ui/hinge/inelastichingeview.h"
 #include "qm_ui/loadcase/loadcaseview.h"
 
 #include <QEvent>
@@ -93,6 +95,7 @@ void RegisterLoadCaseViews(CViewFactory& factory)
 {
     RegisterLoadCaseForms(factory);
     RegisterFigureViews(factory);
+    RegisterInelasticHingeView(factory);
     (void)RegisterRPSService(); // 0 where another agency has the name: its services are then used
 }
 
@@ -103,7 +106,15 @@ T_COMMANDS LoadCaseCommands(T_DESKTOP& desktop)
     const auto list = [&desktop] {
         (void)CreateOrActivateRPSDlg(&desktop.doc, IDD_PO_LOADCASE_LIST, &desktop.view, nullptr);
     };
+    const auto inelastic = [&desktop] {
+        CPO_InelasticHingeDlg hinges;
+        hinges.SetDoc(&desktop.doc);
+        hinges.SetView(&desktop.view);
+        (void)hinges.DoModal();
+        desktop.changed();
+    };
     return {{kMenu, "IDS_QM_UI_POLC_LIST", "Ctrl+Shift+P", list},
+            {kMenu, "IDS_QM_UI_IEHP_MENU", "", inelastic},
             {kMenu},
             {kMenu, "IDS_QM_UI_FIGURE_MENU_0", "", Figure(3)},
             {kMenu, "IDS_QM_UI_FIGURE_MENU_E", "", Figure(4)},

@@ -12,8 +12,6 @@
 
 namespace {
 
-constexpr int kSelectLoadCase = 1;
-
 std::unique_ptr<CRPSDlgBase> MakeDialog(int id)
 {
     if (id == IDD_PO_LOADCASE_ITEM) return std::make_unique<CPO_LoadCaseDlg>();

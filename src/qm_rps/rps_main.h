@@ -14,6 +14,9 @@ inline constexpr int IDD_PO_LOADCASE_LIST = 5676; // CPO_LoadCaseListDlg
 CRPSDlgBase* CreateOrActivateRPSDlg(CDBDoc* doc, int id, zql::frx::IDialogView* parent,
                                     const int* parameter);
 
+/// Kinds of RPS_DoModal: the selection of a pushover load case.
+inline constexpr int kSelectLoadCase = 1;
+
 /// kind 1: the selection of a pushover load case of the current document, modal, in the view that
 /// is installed for it. data: null, or the key that is chosen at first; on OK it gets the chosen
 /// one. Every other kind does nothing.

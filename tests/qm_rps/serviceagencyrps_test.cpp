@@ -6,6 +6,7 @@
 #include "qm_base/appbase.h"
 #include "qm_rps/po_hingeskcvtabfemaaxialdlg.h"
 #include "qm_rps/po_hingeskcvtabfemadlg.h"
+#include "qm_rps/po_inelastichingedlg.h"
 #include "qm_rps/rps_main.h"
 
 namespace {
@@ -192,4 +193,29 @@ TEST_F(Service, WithoutADocumentNothingIsShown)
     EXPECT_EQ(0, Ask({.kind = 1, .index = 4, .record = &record}));
     EXPECT_EQ(0, Ask({.kind = 3}));
     EXPECT_EQ(0, m_view.m_shown);
+}
+
+// The window of inelastic hinges asks the agency for both editors; what is accepted is one edit.
+TEST_F(Service, TheWindowOfInelasticHingesStoresWhatTheEditorsGive)
+{
+    (void)RegisterRPSService();
+    CPO_InelasticHingeDlg hinges;
+    hinges.SetDoc(&m_doc);
+    EXPECT_EQ(0, hinges.OnCurve()); // there is no record
+    ASSERT_EQ(1, hinges.OnNew());
+    EXPECT_EQ(0, hinges.OnAxialForces()); // nor a curve
+    m_view.m_run = [](zql::frx::MDialog& dialog) {
+        auto& fema = dynamic_cast<CPO_HingeSkcvTabFemaDlg&>(dialog);
+        *fema.Curve(HINGE_COMPONENT::My, HINGE_END::Both) = GoodCurve();
+        return 1;
+    };
+    ASSERT_EQ(1, hinges.OnCurve());
+    EXPECT_EQ("0", hinges.Cells().rows.at(4).at(2));
+    m_view.m_run = [](zql::frx::MDialog& dialog) {
+        return dynamic_cast<CPO_HingeSkcvTabFemaAxialDlg&>(dialog).AddForce(250.0);
+    };
+    ASSERT_EQ(1, hinges.OnAxialForces());
+    EXPECT_EQ("1", hinges.Cells().rows.at(4).at(2));
+    EXPECT_EQ(1, m_doc.Undo().Undo());
+    EXPECT_EQ("0", hinges.Cells().rows.at(4).at(2));
 }

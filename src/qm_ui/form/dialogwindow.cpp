@@ -11,6 +11,8 @@
 #include <QScrollArea>
 #include <QVBoxLayout>
 
+#include <algorithm>
+
 namespace {
 
 QString Text(const char* key)
@@ -125,8 +127,22 @@ QSize CDialogWindow::WantedSize() const
     return need.expandedTo(m_view.size).boundedTo(most);
 }
 
+/// Right of the parent where there is room, else left of it, else at the screen's right edge.
+void CDialogWindow::PutBeside()
+{
+    if (!parentWidget()) return;
+    const QRect asks = parentWidget()->window()->frameGeometry();
+    const QRect room = screen()->availableGeometry();
+    const int right = asks.right() + 1, left = asks.left() - width();
+    const int last = room.right() + 1 - width();
+    const int x = right <= last ? right : left >= room.left() ? left : last;
+    move(std::max(x, room.left()),
+         std::clamp(asks.top(), room.top(), std::max(room.top(), room.bottom() + 1 - height())));
+}
+
 void CDialogWindow::showEvent(QShowEvent* event)
 {
     resize(WantedSize());
+    if (m_view.placement == PLACEMENT::Beside) PutBeside();
     QDialog::showEvent(event);
 }

@@ -31,6 +31,7 @@ private:
     void ShowTexts();
     bool MayDrop();
     QSize WantedSize() const;
+    void PutBeside();
 
     T_VIEW m_view;
     zql::frx::MDialog& m_model;

@@ -11,6 +11,12 @@
 #include <memory>
 #include <typeindex>
 
+/// Where a window comes up. The number is that of the host's rule.
+enum class PLACEMENT {
+    Free = 0,  // where the window system puts it
+    Beside = 3 // beside the window that asks, as far as the screen allows: it explains that one
+};
+
 /// How a view fills its window.
 struct T_VIEW {
     TextFn title{};
@@ -21,6 +27,7 @@ struct T_VIEW {
     std::function<std::string(const zql::frx::MDialog& model)> accept{};
     bool showsOnly = false; // one button, "Close"
     QSize size{};           // wanted; empty: what the form needs
+    PLACEMENT placement = PLACEMENT::Free;
     /// Asked before the window closes without accepting; false: it stays open. Empty: it closes.
     std::function<bool(zql::frx::MDialog& model)> closes{};
 };

@@ -32,6 +32,7 @@ void RegisterFigure(CViewFactory& factory)
     T_VIEW more;
     more.showsOnly = true;
     more.size = kFigureSize;
+    more.placement = PLACEMENT::Beside;
     factory.Register<FIGURE>(
         KeyText(title), [](CFormView& form, FIGURE& figure) { BuildFigure(form, figure); }, more);
 }
