@@ -2,11 +2,18 @@
 
 #include "mainwindow.h"
 #include "pushoverwindow.h"
+#include "json/reportjson.h"
 
 #include "qm_base/msgfunction.h"
+#include "qm_db/filectrl.h"
+#include "qm_rps/irpsinterfaceimpl.h"
+#include "qm_rps/pushoveradditionalstepdlg.h"
 #include "qm_rps/pushovercomparisondlg.h"
+#include "qm_rps/pushovercontroldlg.h"
 #include "qm_rps/pushovercurvedampparamuser.h"
 #include "qm_rps/pushovertextdlg.h"
+#include "qm_rps/rps_main.h"
+#include "qm_rps/rpsmanager.h"
 #include "qm_ui/pushover/pushovercurveview.h"
 
 namespace {
@@ -46,6 +53,23 @@ T_WINDOW_EXAMPLE DialogExample(const char* name, QSize size, MAKE make)
             }};
 }
 
+/// What a seismic report says of the model, as JSON in a file that the person names.
+void SaveReportData(T_DESKTOP& desktop)
+{
+    IRPSInterfaceImpl report;
+    if (!report.BuildReport()) {
+        desktop.view.ShowMessage("IDS_QM_UI_FILE_REFUSED", report.Error());
+        return;
+    }
+    const std::string path = AskFileName(desktop.window, true, Text("IDS_QM_UI_REPORT_DATA_TITLE"),
+                                         Text("IDS_QM_UI_REPORT_DATA_FILTER"))
+                                 .toStdString();
+    T_FILE_ERROR error;
+    if (!path.empty() &&
+        !CFileCtrl::WriteWholeFile(path, ReportJson(*CRPSManager::Current()->ReportInfo()), error))
+        desktop.view.ShowMessage("IDS_QM_UI_FILE_REFUSED", error.text);
+}
+
 T_VIEW ShowsOnly(int width, int height)
 {
     T_VIEW view;
@@ -62,6 +86,10 @@ void RegisterPushoverViews(CViewFactory& factory)
                                          ShowsOnly(1280, 860));
     factory.Register<CPushOverCurveDampParamUser>(KeyText("IDS_QM_UI_PUSH_USER_TITLE"),
                                                   BuildUserDamping);
+    factory.Register<CPushOverControlDlg>(KeyText("IDS_QM_UI_PUSH_CONTROL_TITLE"),
+                                          BuildPushOverControl);
+    factory.Register<CPushOverAdditionalStepDlg>(KeyText("IDS_QM_UI_PUSH_STEPS_TITLE"),
+                                                 BuildAdditionalSteps);
     factory.Register<CPushOverTextDlg>(KeyText("IDS_QM_UI_PUSH_TEXT_TITLE"), BuildPushOverText,
                                        ShowsOnly(900, 640));
     factory.Register<CPushOverComparisonDlg>(KeyText("IDS_QM_UI_PUSH_COMPARE_TITLE"),
@@ -88,10 +116,22 @@ T_COMMANDS PushoverCommands(T_DESKTOP& desktop)
         comparison.Update();
         (void)comparison.DoModal();
     };
+    const auto choose = [&desktop] {
+        int key = 0; // the one that was chosen last
+        RPS_DoModal(kSelectLoadCase, &key);
+        T_POLC_D polc;
+        if (key == 0 || !desktop.doc.Attr().GetPolc(key, polc)) return;
+        CPushOverWindow& window = CPushOverWindow::Show(desktop);
+        window.Model().m_settings.push = polc.name;
+        window.Model().OnEdited();
+        window.Form().Refresh();
+    };
     return {{kMenu, "IDS_QM_UI_PUSH_CURVE", "F7", [&desktop] { CPushOverWindow::Show(desktop); },
              hasCase},
             {kMenu, "IDS_QM_UI_PUSH_NEW_CURVE", "Shift+F7", fresh, hasCase},
-            {kMenu, "IDS_QM_UI_PUSH_COMPARE_ALL", "Ctrl+F7", compare, hasCase}};
+            {kMenu, "IDS_QM_UI_PUSH_COMPARE_ALL", "Ctrl+F7", compare, hasCase},
+            {kMenu, "IDS_QM_UI_PUSH_CHOOSE_CASE", "", choose, hasCase},
+            {kMenu, "IDS_QM_UI_REPORT_DATA", "", [&desktop] { SaveReportData(desktop); }}};
 }
 
 bool OpenPushoverRecord(T_DESKTOP& desktop, EXPLORER_TABLE table, int key)

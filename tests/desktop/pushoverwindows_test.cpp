@@ -294,6 +294,48 @@ TEST_F(PushoverWindows, TheComparisonShowsEveryMethodAndIsExported)
     EXPECT_TRUE(Contents(File("all.svg")).contains("NTC2018 SLV"));
 }
 
+TEST_F(PushoverWindows, ControlOptionsAndStepsHaveWindowsOfTheirOwn)
+{
+    OpenCurve();
+    {
+        CAnswers answers({CAnswers::Fill([](CDialogWindow& d) { Enter(d, "node2", "99999"); }),
+                          CAnswers::Accept(), // there is no such node
+                          CAnswers::Fill([](CDialogWindow& d) {
+                              Enter(d, "node2", "31");
+                              Enter(d, "weight", "1000");
+                          })});
+        Click(Field("control"));
+        EXPECT_TRUE(answers.m_texts.value(0).contains("not in the model"));
+    }
+    EXPECT_EQ(1000.0, Result().eval.weight);
+    ASSERT_EQ(1U, Result().curve.monitored.size());
+    EXPECT_TRUE(Result().curve.monitored[0].hasResults);
+    {
+        CAnswers answers({CAnswers::Fill([](CDialogWindow& d) {
+            for (const char* step : {"5", "7"}) {
+                Enter(d, "step", step);
+                Push(d, "add");
+            }
+        })});
+        Click(Field("stepsDlg"));
+    }
+    ASSERT_EQ(2U, Result().additionalSteps.size());
+    EXPECT_EQ(7, Result().additionalSteps[1].step);
+}
+
+TEST_F(PushoverWindows, TheLoadCaseIsChosenAndTheReportDataAreThoseOfTheCommandLine)
+{
+    OpenCurve();
+    {
+        CAnswers answers({CAnswers::Fill([](CDialogWindow& d) { Grid(d, "rows").selectRow(1); })});
+        Run("IDS_QM_UI_PUSH_CHOOSE_CASE");
+    }
+    EXPECT_EQ(m_main->Doc().Data().Model().pushovers.at(2).name, Result().eval.push);
+    AnswerFileName(File("data.json"));
+    Run("IDS_QM_UI_REPORT_DATA");
+    EXPECT_EQ(Program({"report-data", Example(kFrame)}), Contents(File("data.json")));
+}
+
 TEST_F(PushoverWindows, OneWindowFollowsTheDocumentAndTheLanguage)
 {
     ASSERT_TRUE(Open(kFrame));

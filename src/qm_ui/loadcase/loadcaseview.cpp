@@ -119,6 +119,11 @@ void BuildDisplacement(CFormView& form, D& d)
 
 void BuildControl(CFormView& form, D& d)
 {
+    form.Choice(KeyText("IDS_QM_UI_POLC_CONTROL_NODE"),
+                {[&d] { return d.m_case.controlOption == 1 ? 0 : 1; },
+                 [&d](const int& i) { d.m_case.controlOption = i == 0 ? 1 : 2; }},
+                KeyTexts({"IDS_QM_UI_POLC_NODE_NAMED", "IDS_QM_UI_POLC_NODE_FOUND"}))
+        .name = "controlOption";
     CFormField& has =
         form.Flag(KeyText("IDS_QM_UI_POLC_HAS_CONTROL"), {[&d] { return HasControl(d); },
                                                           [&d](bool on) {

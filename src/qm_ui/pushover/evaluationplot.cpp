@@ -3,6 +3,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/pushover/adrsformulas.h"
+#include "qm_rps/pushover/report/pushovercells.h"
 #include "qm_ui/pushover/adrscurve.h"
 
 #include <algorithm>
@@ -95,6 +96,17 @@ void AddPoint(T_PLOT& plot, const T_PUSH_EVALUATION& e)
                            PLOT_MARKER::Circle, true});
 }
 
+/// The first change of slope, and the effective periods by ductility as lines; T0 has one anyway.
+void AddSlopeAndPeriods(T_PLOT& plot, const T_PUSH_EVALUATION& e)
+{
+    if (e.slopeChange)
+        plot.labels.push_back({e.slopeChange->x, e.slopeChange->y,
+                               MMSGFunction::GetValue("IDS_QM_UI_PLOT_SLOPE_CHANGE"),
+                               PLOT_MARKER::Plus, false});
+    for (std::size_t i = 1; i < e.teffs.size(); ++i)
+        AddRadial(plot, TeffName(i).c_str(), e.teffs[i], e.factors.gravity);
+}
+
 /// Other points where demand equals capacity, additional steps and points.
 void AddExtras(T_PLOT& plot, const T_PUSH_EVALUATION& e)
 {
@@ -147,6 +159,7 @@ void SetRanges(T_PLOT& plot, const T_PUSH_EVALUATION& e)
         x = std::max(x, t.dpi);
     for (const T_GUIDE_LINE& g : e.guideLines)
         x = std::max(x, g.Sd);
+    if (!IsOtherPlot(e)) x = std::max(x, e.curve.largestX);
     for (const double a : e.demand.Sa)
         y = std::max(y, a);
     for (const T_ADRS_CURVE& c : e.stateDemands) {
@@ -199,6 +212,60 @@ void AddEvaluationNotes(T_PLOT& plot, const T_PUSH_EVALUATION& e)
                                     ForceUnit(e).c_str(), LengthUnit(e).c_str()));
 }
 
+namespace {
+
+/// A curve of Sd and Sa over its periods: T = 2 pi sqrt(Sd / (Sa g)); points without force have
+/// none.
+T_ADRS_CURVE OverPeriods(const T_ADRS_CURVE& c, double gravity)
+{
+    T_ADRS_CURVE out;
+    for (std::size_t i = 0; i < c.Sd.size(); ++i) {
+        if (!(c.Sa[i] > 0.0)) continue;
+        out.Sd.push_back(SecantPeriod(c.Sd[i], c.Sa[i], gravity));
+        out.Sa.push_back(c.Sa[i]);
+    }
+    return out;
+}
+
+} // namespace
+
+T_PLOT DemandPlot(const T_PUSH_EVALUATION& e)
+{
+    const bool byPeriod = e.shownOver == SPECTRUM_SHOW::Period;
+    T_PUSH_EVALUATION shown;
+    const auto take = [&](const T_ADRS_CURVE& c) {
+        return byPeriod ? OverPeriods(c, e.factors.gravity) : c;
+    };
+    shown.demand = take(e.demand);
+    for (const T_ADRS_CURVE& c : e.stateDemands)
+        shown.stateDemands.push_back(take(c));
+    T_PLOT plot;
+    plot.title = e.eval.spectrum;
+    plot.x.title = byPeriod
+                       ? "T (s)"
+                       : MMSGFunction::GetValue("IDS_QM_UI_PLOT_SD") + " (" + LengthUnit(e) + ")";
+    plot.y.title = MMSGFunction::GetValue("IDS_QM_UI_PLOT_SA") + " (g)";
+    AddDemands(plot, shown);
+    AddAdrsCurve(plot, MMSGFunction::GetValue("IDS_QM_UI_PLOT_REDUCED").c_str(), take(e.reduced),
+                 PLOT_LINE::Dash, 1.8, kRed);
+    return plot;
+}
+
+void AddMonitoredNodes(T_PLOT& plot, const T_PUSH_EVALUATION& e)
+{
+    for (const T_MONITORED_NODE& node : e.curve.monitored) {
+        if (!node.hasResults) continue;
+        T_PLOT_SERIES s;
+        s.name = MMSGFunction::Format("IDS_QM_UI_PUSH_NODE_COLUMN", {std::to_string(node.node)});
+        s.x = node.x;
+        s.y = e.curve.y;
+        s.line = PLOT_LINE::Dot;
+        s.marker = PLOT_MARKER::None;
+        s.color = kGray;
+        plot.series.push_back(std::move(s));
+    }
+}
+
 T_PLOT EvaluationPlot(const T_PUSH_EVALUATION& e)
 {
     T_PLOT plot;
@@ -219,6 +286,8 @@ T_PLOT EvaluationPlot(const T_PUSH_EVALUATION& e)
     AddTrials(plot, e);
     AddPoint(plot, e);
     AddExtras(plot, e);
+    AddSlopeAndPeriods(plot, e);
+    if (!IsOtherPlot(e)) AddMonitoredNodes(plot, e);
     AddRadial(plot, "T0", PeriodOfFirstStep(e), e.factors.gravity);
     if (e.point) AddRadial(plot, "T_eff", e.point->Teff, e.factors.gravity);
     SetRanges(plot, e);

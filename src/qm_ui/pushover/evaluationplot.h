@@ -8,8 +8,13 @@
 /// initial-stiffness and effective-period lines, with units, legend and results below.
 T_PLOT EvaluationPlot(const T_PUSH_EVALUATION& e);
 
+/// The demand spectrum alone, and the reduced one, over what the evaluation shows it.
+T_PLOT DemandPlot(const T_PUSH_EVALUATION& e);
+
 // Parts that other pictures of an evaluation share.
 std::string PlotStepText(int step);
 std::string PlotSubtitle(const T_PUSH_EVALUATION& e);
+/// Displacements of the further nodes, against the forces of the plotted curve.
+void AddMonitoredNodes(T_PLOT& plot, const T_PUSH_EVALUATION& e);
 /// The results below the picture.
 void AddEvaluationNotes(T_PLOT& plot, const T_PUSH_EVALUATION& e);

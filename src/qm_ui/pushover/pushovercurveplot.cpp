@@ -63,6 +63,7 @@ T_PLOT OtherPlot(const T_PUSH_EVALUATION& e)
     curve.width = 2.6;
     curve.color = kBlack;
     plot.series.push_back(std::move(curve));
+    AddMonitoredNodes(plot, e);
     AddPlaces(plot, e);
     AddEvaluationNotes(plot, e);
     return plot;

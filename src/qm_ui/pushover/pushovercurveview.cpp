@@ -4,6 +4,7 @@
 #include "qm_rps/pushover/report/pushovercells.h"
 #include "qm_ui/plot/plotdrawing.h"
 #include "qm_ui/plot/plotfile.h"
+#include "qm_ui/pushover/evaluationplot.h"
 #include "qm_ui/pushover/pushovercurveplot.h"
 #include "qm_ui/pushover/pushoverfields.h"
 #include "qm_ui/report/printing.h"
@@ -109,6 +110,7 @@ void BuildDamping(CFormView& form, MODEL& m)
         {[&s] { return s.driftKind.value_or(1) - 1; }, [&s](const int& i) { s.driftKind = i + 1; }},
         KeyTexts({"IDS_QM_UI_PUSH_DRIFT_1", "IDS_QM_UI_PUSH_DRIFT_2"}));
     drift.name = "driftKind";
+    form.Button(KeyText("IDS_QM_UI_PUSH_CONTROL"), [&m] { (void)m.OnControl(); }).name = "control";
     drift.shown = [&m] { return m.m_methodPage.IsTarget(); };
     auto& masonry = form.Flag(KeyText("IDS_QM_UI_PUSH_MASONRY"), {[&m] { return m.IsMasonry(); },
                                                                   [&m, &s](const bool& on) {
@@ -145,6 +147,16 @@ void BuildBilinear(CFormView& form, MODEL& model)
     form.Note(KeyText(CPushOverCurveSub4Dlg::kLabels[1]));
     form.Optional(KeyText("IDS_QM_UI_PUSH_FRACTION"), value(&T_EVAL_BILINEAR::secant)).name =
         "bilinear.secant";
+    form.Choice(KeyText(CPushOverCurveSub4Dlg::kLabels[2]),
+                {[&m] { return m.Options().strength == "peak" ? 1 : 0; },
+                 [&m](const int& i) {
+                     if (i == 1)
+                         m.Options().strength = "peak";
+                     else
+                         m.Options().strength.reset();
+                 }},
+                KeyTexts({"IDS_QM_UI_PUSH_STRENGTH_RULE", "IDS_QM_UI_PUSH_STRENGTH_PEAK"}))
+        .name = "bilinear.strength";
     form.Note(KeyText(CPushOverCurveSub4Dlg::kLabels[3]));
     form.Optional(KeyText("IDS_QM_UI_PUSH_FRACTION"), value(&T_EVAL_BILINEAR::drop)).name =
         "bilinear.drop";
@@ -194,6 +206,18 @@ void BuildResults(CFormView& form, MODEL& m)
     form.Grid(GridOf([&m] { return PushoverCurveCells(m.Shown().Pictured()); })).name = "curve";
 }
 
+/// The demand alone, over displacements or periods.
+void BuildDemand(CFormView& form, MODEL& m)
+{
+    form.Page(KeyText("IDS_QM_UI_HEAD_SPECTRUM"));
+    form.Choice(KeyText("IDS_QM_UI_PUSH_SPECTRUM_OVER"),
+                {[&m] { return static_cast<int>(m.m_show.spectrumOver); },
+                 [&m](const int& i) { m.m_show.spectrumOver = static_cast<SPECTRUM_SHOW>(i); }},
+                KeyTexts({"IDS_QM_UI_PUSH_OVER_SD", "IDS_QM_UI_PUSH_OVER_T"}))
+        .name = "spectrumOver";
+    AddPicture(form, [&m] { return DemandPlot(m.Shown().Result()); }, {680, 260}).name = "demand";
+}
+
 void BuildAdditional(CFormView& form, MODEL& m)
 {
     const auto list = [&form](T_GRID_BINDING grid, int& row, const char* name) {
@@ -215,6 +239,7 @@ void BuildAdditional(CFormView& form, MODEL& m)
     buttons(
         "IDS_QM_UI_PUSH_ADD_STEP", [&m] { m.OnAddStep(); }, [&m] { m.OnRemoveStep(m.m_stepRow); },
         "Step");
+    form.Button(KeyText("IDS_QM_UI_PUSH_STEPS_DLG"), [&m] { (void)m.OnSteps(); }).name = "stepsDlg";
     form.Page(KeyText("IDS_QM_UI_PUSH_PAGE_POINTS"), [&m] { return !m.m_methodPage.IsTarget(); });
     list(GridOf([&m] { return AdditionalPointCells(m.Shown().Result()); }), m.m_pointRow, "points");
     const auto spectra = [&m] { return m.m_demandPage.Spectra(); };
@@ -270,6 +295,9 @@ void BuildPushOverCurve(CFormView& form, CPushOverCurveEdit& m)
     auto& refusal = form.Note([&m] { return m.Shown().Refusal(); });
     refusal.name = "refusal";
     refusal.shown = [&m] { return !m.Shown().Refusal().empty(); };
+    auto& remark = form.Note([&m] { return RemarkLine(m.Shown().Result()); });
+    remark.name = "remark";
+    remark.shown = [&m] { return !m.Shown().Result().messages.empty(); };
     const auto plot = [&m] {
         T_PLOT shown = PlotOf(m);
         shown.notes.clear(); // their values stand in the cells
@@ -284,6 +312,7 @@ void BuildPushOverCurve(CFormView& form, CPushOverCurveEdit& m)
     trial.name = "trial";
     trial.shown = [&m] { return !m.m_methodPage.IsTarget(); };
     BuildResults(form, m);
+    BuildDemand(form, m);
     BuildAdditional(form, m);
     form.EndPages();
     BuildButtons(form, m);

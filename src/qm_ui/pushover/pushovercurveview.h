@@ -3,13 +3,17 @@
 
 #include "qm_ui/form/viewfactory.h"
 
+class CPushOverAdditionalStepDlg;
 class CPushOverComparisonDlg;
+class CPushOverControlDlg;
 class CPushOverCurveDampParamUser;
 class CPushOverCurveEdit;
 class CPushOverTextDlg;
 
 /// The window: settings left, picture, trials, results and commands right.
 void BuildPushOverCurve(CFormView& form, CPushOverCurveEdit& model);
+void BuildPushOverControl(CFormView& form, CPushOverControlDlg& model);
+void BuildAdditionalSteps(CFormView& form, CPushOverAdditionalStepDlg& model);
 void BuildUserDamping(CFormView& form, CPushOverCurveDampParamUser& model);
 /// Preview of a text with a button that saves it.
 void BuildPushOverText(CFormView& form, CPushOverTextDlg& model);

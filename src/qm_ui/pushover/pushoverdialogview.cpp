@@ -1,5 +1,9 @@
 // Views of the dialogs of the pushover curve window.
+#include "qm_base/msgfunction.h"
+#include "qm_rps/dialog/texttable.h"
+#include "qm_rps/pushoveradditionalstepdlg.h"
 #include "qm_rps/pushovercomparisondlg.h"
+#include "qm_rps/pushovercontroldlg.h"
 #include "qm_rps/pushovercurvedampparamuser.h"
 #include "qm_rps/pushovertextdlg.h"
 #include "qm_ui/plot/plotfile.h"
@@ -7,6 +11,50 @@
 #include "qm_ui/pushover/pushovercurveplot.h"
 #include "qm_ui/pushover/pushovercurveview.h"
 #include "qm_ui/pushover/pushoverfields.h"
+
+using zql::lib::MMSGFunction;
+
+void BuildPushOverControl(CFormView& form, CPushOverControlDlg& m)
+{
+    form.SetFindings([&m] { return m.Findings(); });
+    form.Note([&m] { return m.ControlText(); });
+    form.Choice(KeyText("IDS_QM_UI_PUSH_DRIFT_KIND"),
+                {[&m] { return m.m_driftKind - 1; }, [&m](const int& i) { m.m_driftKind = i + 1; }},
+                KeyTexts({"IDS_QM_UI_PUSH_DRIFT_1", "IDS_QM_UI_PUSH_DRIFT_2"}))
+        .name = "driftKind";
+    form.Optional(KeyText("IDS_QM_UI_PUSH_WEIGHT"), Ref(m.m_weight),
+                  PlainLabel(std::string(NameOf(m.Units().force))))
+        .name = "weight";
+    for (std::size_t i = 0; i < m.m_nodes.size(); ++i) {
+        const auto caption = [i] {
+            return MMSGFunction::Format("IDS_QM_UI_PUSH_NODE", {std::to_string(i + 1)});
+        };
+        form.Integer(caption, Ref(m.m_nodes[i])).name =
+            i == 0 ? "monitoredNodes" : "node" + std::to_string(i + 1);
+    }
+}
+
+void BuildAdditionalSteps(CFormView& form, CPushOverAdditionalStepDlg& m)
+{
+    form.Note([&m] {
+        return MMSGFunction::Format("IDS_QM_UI_PUSH_STEPS_NOTE", {std::to_string(m.StepCount())});
+    });
+    T_GRID_BINDING list = GridOf([&m] {
+        T_TEXT_TABLE t{{{MMSGFunction::GetValue("IDS_QM_UI_PUSH_STEP"), true}}, {}};
+        for (const int step : m.Steps())
+            t.rows.push_back({std::to_string(step)});
+        return t;
+    });
+    list.selected = [&m] { return m.m_row; };
+    list.select = [&m](int row) { m.m_row = row; };
+    form.Grid(std::move(list)).name = "list";
+    form.Integer(KeyText("IDS_QM_UI_PUSH_STEP"), Ref(m.m_step)).name = "step";
+    form.Columns();
+    form.Button(KeyText("IDS_QM_UI_PUSH_ADD_STEP"), [&m] { m.OnAdd(); }).name = "add";
+    form.NextColumn();
+    form.Button(KeyText("IDS_QM_UI_PUSH_REMOVE"), [&m] { m.OnRemove(); }).name = "remove";
+    form.EndColumns();
+}
 
 void BuildUserDamping(CFormView& form, CPushOverCurveDampParamUser& m)
 {
