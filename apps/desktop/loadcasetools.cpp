@@ -206,5 +206,9 @@ std::vector<T_WINDOW_EXAMPLE> LoadCaseWindowExamples()
                                                  [](CMainWindow&, auto&) {}),
             ExampleOf<CPO_FEMAUnloadStiffFigureEDlg>("figure-unloading", kHinges,
                                                      [](CMainWindow&, auto&) {}),
+            ExampleOf<CPO_InelasticHingeDlg>("inelastic-hinges", kHinges,
+                                             [](CMainWindow& main, CPO_InelasticHingeDlg& dialog) {
+                                                 dialog.SetDoc(&main.Doc());
+                                             }),
             ExampleOf<CPO_HingeSkcvTabFemaAxialDlg>("axial-forces", kHinges, FillAxial)};
 }

@@ -159,10 +159,27 @@ std::vector<T_WINDOW_EXAMPLE> PushoverWindowExamples()
         model->Data2Dlg({10.0, 0.9, 40.0, 0.4});
         return model;
     };
+    const auto control = [](CDBDoc& doc) {
+        auto model = std::make_unique<CPushOverControlDlg>(doc);
+        T_EVAL_D evaluation;
+        if (doc.Attr().GetEval(1, evaluation)) evaluation.monitoredNodes = {31, 21};
+        model->Data2Dlg(evaluation);
+        return model;
+    };
+    const auto steps = [](CDBDoc&) {
+        auto model = std::make_unique<CPushOverAdditionalStepDlg>();
+        model->SetStepCount(50);
+        T_FINDING refusal;
+        for (const int step : {12, 30})
+            (void)model->AddStep(step, refusal);
+        return model;
+    };
     return {CurveExample("pushover-atc40", "PX_MODE1 ATC-40 A", 2),
             CurveExample("pushover-fema440", "PX_MODE1 FEMA440 C", 0),
             CurveExample("pushover-ec8", "PX_MODE1 EC8", 0),
             CurveExample("pushover-ntc", "PX_MODE1 NTC2018", 0),
             DialogExample<CPushOverComparisonDlg>("pushover-comparison", {1000, 880}, comparison),
+            DialogExample<CPushOverControlDlg>("pushover-control", {560, 420}, control),
+            DialogExample<CPushOverAdditionalStepDlg>("pushover-steps", {480, 420}, steps),
             DialogExample<CPushOverCurveDampParamUser>("pushover-damping", {560, 560}, damping)};
 }
