@@ -5,7 +5,9 @@
 #include "qm_db/recordfacts.h"
 #include "qm_rps/hinge/hingegenerator.h"
 #include "qm_rps/hinge/hingetypefindings.h"
+#include "qm_rps/po_hingetypedlg.h"
 #include "qm_rps/po_hingetypelistdlg.h"
+#include "qm_rps/pushoverhingelistdlg.h"
 
 namespace {
 
@@ -44,16 +46,23 @@ std::string StrengthText(double strength, bool automatic)
     return automatic ? Say("IDS_QM_CLI_HINGE_AUTOMATIC") : ShortestText(strength);
 }
 
-void PrintSide(const char* name, const T_SKEL_SIDE& s, bool automatic, SKEL_TYPE)
+/// What the sides of a curve are printed with.
+struct T_SIDE_LOOK {
+    bool automatic = false, criteria = true; // strength; criteria in use
+    SKEL_TYPE type = SKEL_TYPE::Bilinear;
+};
+
+void PrintSide(const char* name, const T_SKEL_SIDE& s, const T_SIDE_LOOK& look)
 {
-    PrintDetail(Say("IDS_QM_CLI_HINGE_SIDE", name, StrengthText(s.yield, automatic),
+    const auto criterion = [&](double v) { return CriterionText(look.criteria, v); };
+    PrintDetail(Say("IDS_QM_CLI_HINGE_SIDE", name, StrengthText(s.yield, look.automatic),
                     ShortestText(s.yieldDeform), Text(s.B), Text(s.C), Text(s.D), Text(s.E),
-                    ShortestText(s.IO), ShortestText(s.LS), ShortestText(s.CP)));
+                    criterion(s.IO), criterion(s.LS), criterion(s.CP)));
 }
 
-void PrintSide(const char* name, const T_SKEL_MULTI_SIDE& s, bool automatic, SKEL_TYPE type)
+void PrintSide(const char* name, const T_SKEL_MULTI_SIDE& s, const T_SIDE_LOOK& look)
 {
-    const bool tri = IsTrilinear(type);
+    const bool tri = IsTrilinear(look.type), automatic = look.automatic;
     PrintDetail(Say("IDS_QM_CLI_HINGE_MULTI_SIDE", name, StrengthText(s.P1, automatic && !tri),
                     StrengthText(s.P2, automatic && tri), ShortestText(s.P3), ShortestText(s.D1),
                     ShortestText(s.D2), ShortestText(s.D3), ShortestText(s.alpha1),
@@ -65,8 +74,10 @@ void PrintCurve(HINGE_END end, const T_SKEL_CURVE& curve, SKEL_TYPE type)
     std::printf("    %s:\n", EndName(end).c_str());
     std::visit(
         [&](const auto& c) {
-            PrintSide("(+)", c.sides.pos, c.autoYield, type);
-            PrintSide("(-)", c.sides.neg, c.autoYield, type);
+            T_SIDE_LOOK look{c.autoYield, true, type};
+            if constexpr (requires { c.compliance; }) look.criteria = c.compliance;
+            PrintSide("(+)", c.sides.pos, look);
+            PrintSide("(-)", c.sides.neg, look);
         },
         curve);
     const auto* fema = std::get_if<T_SKEL_FEMA>(&curve);
@@ -78,6 +89,21 @@ void PrintCurve(HINGE_END end, const T_SKEL_CURVE& curve, SKEL_TYPE type)
         PrintDetail(Say("IDS_QM_CLI_HINGE_CRITERIA", Say("IDS_RPS_PO_FEMA_Inactive")));
     for (const T_SKEL_AXIAL& axial : fema->curves)
         PrintDetail(Say("IDS_QM_CLI_HINGE_AXIAL_CURVE", ShortestText(axial.axial)));
+}
+
+/// Initial stiffness of every page, as the window of the type shows it.
+void PrintStiffness(CDBDoc& doc, int key, const T_PHGT_D& type)
+{
+    CPO_HingeTypeDlg dlg(HingeContextOf(doc));
+    dlg.Data2Dlg(type);
+    const std::vector<int> users = doc.Attr().GetElemsByPhgt(key);
+    if (!users.empty() && !doc.Memb().GetMembLengByIncludeElem(users.front(), dlg.m_memberLength))
+        dlg.m_memberLength = 0.0;
+    for (const T_STIFFNESS_ROW& row : dlg.UpdateInitialStiffness()) {
+        const auto cells = dlg.StiffnessCells(row);
+        PrintLine("  " + Say("IDS_QM_CLI_HINGE_STIFFNESS", cells[0], cells[1], cells[2], cells[3],
+                             cells[4]));
+    }
 }
 
 } // namespace
@@ -103,15 +129,20 @@ EXIT_CODE RunHingeShow(const T_HINGE_OPTIONS& o)
                     CPO_HingeTypeListDlg::DataToStr(type.element).c_str(),
                     std::string(NameOf(units.force)).c_str(),
                     std::string(NameOf(units.length)).c_str());
+        PrintLine("  " + Say("IDS_QM_CLI_HINGE_KIND", CPushOverHingeListDlg::KindText(type)));
         for (std::size_t c = 0; c < type.components.size(); ++c) {
             T_HINGE_COMPONENT& component = type.components[c];
             if (!component.active) continue;
-            std::printf("  %s: %s\n", kComponentNames[c],
-                        Say(kCurveTypes[static_cast<std::size_t>(component.type)]).c_str());
+            const std::string model =
+                HingeModelLabel(type.definition, static_cast<HINGE_COMPONENT>(c));
+            std::printf("  %s: %s%s\n", kComponentNames[c],
+                        Say(kCurveTypes[static_cast<std::size_t>(component.type)]).c_str(),
+                        model.empty() ? "" : (", " + model).c_str());
             ForEachPage(component, [&](HINGE_END end, const T_SKEL_CURVE& curve) {
                 PrintCurve(end, curve, component.type);
             });
         }
+        PrintStiffness(doc, key, type);
     });
 }
 

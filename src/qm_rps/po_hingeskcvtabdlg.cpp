@@ -41,6 +41,14 @@ T_PAGE_VALUES CPO_HingeSkcvTabDlg::Calculated(HINGE_END end)
     return curve ? CalculatedPage(m_owner, m_component, end, *curve) : T_PAGE_VALUES{};
 }
 
+void CPO_HingeSkcvTabDlg::OnUserAutoRdo(HINGE_END end, bool automatic)
+{
+    auto* curve = Curve(end);
+    if (!curve) return;
+    curve->autoYield = automatic;
+    OnEdited();
+}
+
 void CPO_HingeSkcvTabDlg::OnEdited()
 {
     ForEachPage(m_data, [&](HINGE_END end, T_SKEL_CURVE& curve) {

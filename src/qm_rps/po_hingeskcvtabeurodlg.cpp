@@ -34,6 +34,14 @@ T_PAGE_VALUES CPO_HingeSkcvTabEuroDlg::Calculated(HINGE_END end)
     return curve ? CalculatedPage(m_owner, m_component, end, *curve) : T_PAGE_VALUES{};
 }
 
+void CPO_HingeSkcvTabEuroDlg::OnUserAutoRdo(HINGE_END end, bool automatic)
+{
+    auto* curve = Curve(end);
+    if (!curve) return;
+    curve->autoYield = automatic;
+    OnEdited();
+}
+
 void CPO_HingeSkcvTabEuroDlg::OnEdited()
 {
     ForEachPage(m_data, [&](HINGE_END end, T_SKEL_CURVE& curve) {

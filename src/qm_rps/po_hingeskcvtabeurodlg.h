@@ -23,6 +23,9 @@ public:
     /// After each edit: automatic pages show what is calculated, the negative side of a symmetric
     /// curve follows the positive one.
     void OnEdited();
+    /// Strengths of a page from section and material, which are shown where they are known, or
+    /// entered.
+    void OnUserAutoRdo(HINGE_END end, bool automatic);
     /// What an automatic page calculates from the type's own section; see CalculatedPage.
     T_PAGE_VALUES Calculated(HINGE_END end);
     /// The curve of a page, or null before Data2Dlg.

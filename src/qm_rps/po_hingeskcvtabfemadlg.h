@@ -66,6 +66,9 @@ public:
     /// Separate pages for I-end and J-end.
     bool IsNeedIJTab(HINGE_COMPONENT c) const;
 
+    /// Strengths of a page from section and material, which are shown where they are known, or
+    /// entered.
+    void OnUserAutoRdo(HINGE_COMPONENT c, HINGE_END end, bool automatic);
     /// Yield strengths from section and material: taken only while they are automatic.
     void SetAutoCalcValue(HINGE_COMPONENT c, HINGE_END end, const T_SIDES<double>& yield);
 
@@ -79,6 +82,8 @@ public:
     /// Keys of the labels of strengths, deformations, yield strength, criteria and drift ratio.
     static std::array<const char*, 5> InfillLabels(bool general);
 
+    /// Runs the table of energy-dissipation factors in the view and takes it when it was accepted.
+    [[nodiscard]] int OnEnergyBtn(HINGE_COMPONENT c, HINGE_END end);
     /// Curves by axial force on or off.
     void OnMultiCurveChk(HINGE_COMPONENT c, HINGE_END end, bool on);
     /// Runs the list of axial forces in the view and takes it when it was accepted.

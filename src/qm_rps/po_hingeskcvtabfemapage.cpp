@@ -1,6 +1,7 @@
 // What a page of the editor of FEMA curves shows.
 #include "qm_base/textformat.h"
 #include "qm_rps/hinge/hingemirror.h"
+#include "qm_rps/po_hingefemaenrgdsptgrid.h"
 #include "qm_rps/po_hingeskcvtabfemadlg.h"
 
 #include <algorithm>
@@ -55,6 +56,27 @@ void CPO_HingeSkcvTabFemaDlg::OnDcRatioChk(HINGE_COMPONENT c, HINGE_END end, boo
     T_SKEL_FEMA* curve = Curve(c, end);
     if (!curve || curve->dcRatio.has_value() == on) return;
     curve->dcRatio = on ? std::optional(T_SIDES<double>{1.0, 1.0}) : std::nullopt;
+}
+
+void CPO_HingeSkcvTabFemaDlg::OnUserAutoRdo(HINGE_COMPONENT c, HINGE_END end, bool automatic)
+{
+    T_SKEL_FEMA* curve = Curve(c, end);
+    if (!curve) return;
+    curve->autoYield = automatic;
+    const T_SIDE_VALUES yield = Calculated(c, end).yield;
+    if (yield.pos && yield.neg) SetAutoCalcValue(c, end, {*yield.pos, *yield.neg});
+    OnEdited();
+}
+
+int CPO_HingeSkcvTabFemaDlg::OnEnergyBtn(HINGE_COMPONENT c, HINGE_END end)
+{
+    if (!Curve(c, end)) return 0;
+    CPO_HingeFEMAEnrgDsptGrid grid;
+    grid.SetView(View());
+    grid.Data2Dlg(ShownSides(c, end));
+    if (!grid.DoModal() || !grid.CheckData()) return 0;
+    grid.Dlg2Data(ShownSides(c, end));
+    return 1;
 }
 
 void CPO_HingeSkcvTabFemaDlg::OnEdited()

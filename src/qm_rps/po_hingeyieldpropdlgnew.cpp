@@ -22,6 +22,16 @@ int CPO_HingeYieldPropDlgNew::OnCalculateBtn()
     return 1;
 }
 
+T_PM_LINES CPO_HingeYieldPropDlgNew::LinesOf(const T_YIELD_LEVEL& level) const
+{
+    if (!m_calculated || !m_owner.sources) return {};
+    T_YIELD_LEVEL same = *m_calculated;
+    same.y.used = level.y.used;
+    same.z.used = level.z.used;
+    if (same != level) return {};
+    return m_owner.sources->Lines(m_owner.type.section, m_owner.type.sectionMaterial);
+}
+
 std::vector<CPO_HingeYieldPropDlgNew::T_LEVEL> CPO_HingeYieldPropDlgNew::Levels()
 {
     if (IsTrilinear(m_type) && !m_surface.crack) m_surface.crack.emplace();

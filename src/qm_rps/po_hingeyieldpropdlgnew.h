@@ -28,6 +28,8 @@ public:
     std::optional<T_YIELD_LEVEL> m_calculated;
     /// Replaces the yield level by the calculated one; axes stay in use or not. 0: there is none.
     [[nodiscard]] int OnCalculateBtn();
+    /// The whole curves of a level that is the calculated one, edited nowhere; else empty.
+    T_PM_LINES LinesOf(const T_YIELD_LEVEL& level) const;
 
     bool m_showValue = false; // IDS_RPS_Show_Value against IDS_RPS_Show_Ratio
 

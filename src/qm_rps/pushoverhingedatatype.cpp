@@ -1,11 +1,14 @@
 #include "qm_rps/pushoverhingedatatype.h"
 
+#include "qm_base/textformat.h"
 #include "qm_rps/hinge/curvefindings.h"
 #include "qm_rps/hinge/hingemirror.h"
 #include "qm_rps/hinge/hingetable.h"
+#include "qm_rps/po_hingeskcvtabfemadlg.h"
 #include "qm_rps/po_hingetypelistdlg.h"
 
 #include <algorithm>
+#include <cmath>
 
 namespace {
 
@@ -13,6 +16,13 @@ constexpr T_SKEL_POINT T_SKEL_SIDE::*kPoints[] = {&T_SKEL_SIDE::B, &T_SKEL_SIDE:
                                                   &T_SKEL_SIDE::E};
 constexpr double T_SKEL_SIDE::*kValues[] = {&T_SKEL_SIDE::IO, &T_SKEL_SIDE::LS, &T_SKEL_SIDE::CP};
 constexpr std::size_t kOrigin = 4; // the row of A
+
+/// Below this a yield deformation counts as none, as the conversion has it.
+constexpr double kNoYield = 1e-7;
+bool KnowsYield(const T_SKEL_SIDE& side)
+{
+    return std::fabs(side.yieldDeform) >= kNoYield;
+}
 
 } // namespace
 
@@ -85,6 +95,35 @@ T_SKEL_FEMA* CPushOverHingeDataType::Curve()
 {
     if (!m_taken) return nullptr;
     return std::get_if<T_SKEL_FEMA>(&At(m_type, m_component).curves.I);
+}
+
+int CPushOverHingeDataType::OnMeasureRdo(SKEL_MEASURE measure)
+{
+    T_SKEL_FEMA* curve = Curve();
+    if (!curve) return 0;
+    if (curve->measure == measure) return 1;
+    if (!KnowsYield(curve->sides.pos) || !KnowsYield(curve->sides.neg)) {
+        ShowMessage("IDS_QM_UI_HINGE_NO_DY");
+        return 0;
+    }
+    return measure == SKEL_MEASURE::Plastic
+               ? CPO_HingeSkcvTabFemaDlg::ConvertHingeParamPR2DDy(*curve)
+               : CPO_HingeSkcvTabFemaDlg::ConvertHingeParamDDy2PR(*curve);
+}
+
+std::string CPushOverHingeDataType::OtherMeasureText(std::size_t row) const
+{
+    const T_SKEL_FEMA* curve = Shown();
+    if (!curve || row == kOrigin || row >= kRows.size()) return {};
+    const bool positive = row > kOrigin;
+    const T_SKEL_SIDE& side = positive ? curve->sides.pos : curve->sides.neg;
+    if (!KnowsYield(side)) return "-";
+    const double value = (side.*kPoints[positive ? row - kOrigin - 1 : kOrigin - 1 - row]).deform;
+    const double sign = positive ? 1.0 : -1.0; // magnitudes are converted
+    const auto convert = curve->measure == SKEL_MEASURE::DDy
+                             ? CPO_HingeSkcvTabFemaDlg::ConvertParamPR2DDy
+                             : CPO_HingeSkcvTabFemaDlg::ConvertParamDDy2PR;
+    return FormatText("%.6g", sign * convert(sign * value, std::fabs(side.yieldDeform)) + 0.0);
 }
 
 T_SKEL_POINT* CPushOverHingeDataType::Point(std::size_t row)

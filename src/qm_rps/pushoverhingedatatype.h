@@ -41,6 +41,12 @@ public:
     /// or it does not exist; 0 without one: the component has no FEMA curve. Nothing changes then.
     [[nodiscard]] int Data2Dlg(int key, HINGE_COMPONENT component);
 
+    /// Switches the measure of the curve. 0: nothing is shown, or (with a message) a side has no
+    /// yield deformation to convert with, and the curve is as it was.
+    [[nodiscard]] int OnMeasureRdo(SKEL_MEASURE measure);
+    /// The deformation of a row in the measure that is not shown; "-" without a yield deformation,
+    /// empty for A.
+    std::string OtherMeasureText(std::size_t row) const;
     /// A point of the diagram by its row, or null (row A, which is the origin, and rows outside).
     T_SKEL_POINT* Point(std::size_t row);
     /// A criterion of a side, or null.

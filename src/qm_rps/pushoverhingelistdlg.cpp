@@ -2,9 +2,12 @@
 
 #include "qm_base/appbase.h"
 #include "qm_base/msgfunction.h"
+#include "qm_rps/hinge/hingechoices.h"
 #include "qm_rps/hinge/hingegenerator.h"
 #include "qm_rps/hinge/hingetable.h"
 #include "qm_rps/po_hingetypelistdlg.h"
+
+#include <algorithm>
 
 using zql::lib::MMSGFunction;
 
@@ -62,6 +65,31 @@ std::string CPushOverHingeListDlg::FamilyText(int code)
 {
     if (code == 0) return MMSGFunction::GetValue("IDS_RPS_MULTILINEAR");
     return code == 1 ? "FEMA" : MMSGFunction::GetValue("IDS_PUSHOVER_Error");
+}
+
+std::string CPushOverHingeListDlg::KindText(const T_PHGT_D& type)
+{
+    std::string text = InteractionText(static_cast<int>(type.interaction));
+    if (type.interactionMz) text += ", " + InteractionText(static_cast<int>(*type.interactionMz));
+    std::vector<std::string> families;
+    for (const T_HINGE_COMPONENT& c : type.components) {
+        if (!c.active) continue;
+        const bool fema = c.type == SKEL_TYPE::Fema;
+        const std::string family = c.type == SKEL_TYPE::Ec8
+                                       ? MMSGFunction::GetValue(CurveKey(c.type))
+                                       : FamilyText(fema ? 1 : 0);
+        if (std::ranges::find(families, family) == families.end()) families.push_back(family);
+    }
+    for (std::size_t i = 0; i < families.size(); ++i)
+        text += (i == 0 ? "; " : ", ") + families[i];
+    return text;
+}
+
+std::string CPushOverHingeListDlg::TypeKind() const
+{
+    const T_TABLE<T_PHGT_D>& types = m_doc.Data().Model().hingeTypes;
+    const auto type = types.find(m_type);
+    return type == types.end() ? std::string() : KindText(type->second);
 }
 
 std::string CPushOverHingeListDlg::ColumnHead(HINGE_COMPONENT c, bool positive)

@@ -13,6 +13,11 @@ public:
 
     /// Text of the interaction kind 0 to 4; another code is an assertion failure and an empty text.
     static std::string InteractionText(int code);
+    /// Interaction kinds of My and Mz and the curve families of a type's active components: "PMM,
+    /// P; FEMA, multilinear".
+    static std::string KindText(const T_PHGT_D& type);
+    /// The same of the chosen type; empty: none is.
+    std::string TypeKind() const;
     /// Text of the curve family: 0 multilinear, 1 FEMA; any other is shown as an error.
     static std::string FamilyText(int code);
     /// Head of the column of a component's strength: "Fx(+)", "Mz(-)".

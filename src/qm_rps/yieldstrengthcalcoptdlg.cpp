@@ -2,6 +2,7 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_rps/desk/elementlist.h"
+#include "qm_rps/hinge/hingechoices.h"
 #include "qm_rps/hinge/hingetable.h"
 #include "qm_rps/yieldstrengthcalcopteffdescdlg.h"
 #include "qm_rps/yieldstrengthcalcoptmatdescdlg.h"
@@ -51,6 +52,11 @@ int CYieldStrengthCalcOptDlg::OnSelectionText(const std::string& text)
 std::string CYieldStrengthCalcOptDlg::SelectionText() const
 {
     return ElementListText(m_data.elements);
+}
+
+std::string CYieldStrengthCalcOptDlg::ModeText() const
+{
+    return YieldCodeText(m_doc.Lib().GetConCodeName(), m_doc.Lib().GetStlCodeName());
 }
 
 std::vector<int> CYieldStrengthCalcOptDlg::Elements() const

@@ -36,6 +36,8 @@ public:
     std::string SelectionText() const;
     const T_YIELD_CALC_OPT& Data() const { return m_data; }
 
+    /// What the design codes of the model mean for the calculation.
+    std::string ModeText() const;
     /// The elements of the calculation, ascending: the selected ones, or all that suit it.
     std::vector<int> Elements() const;
     /// Show the material strengths, and the effective section properties, of these elements in the

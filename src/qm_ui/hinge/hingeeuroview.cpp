@@ -29,6 +29,7 @@ void AddPage(CFormView& form, DLG& dlg, HINGE_END end, const std::string& prefix
 {
     const T_BACKBONE_PAGE page = PageOf(dlg, end, prefix);
     const auto curve = [&dlg, end]() -> T_SKEL_EC8& { return *dlg.Curve(end); };
+    AddModelNote(form, dlg.Which(), dlg.m_owner);
     form.Choice(KeyText("IDS_QM_UI_HINGE_MEASURE"),
                 {[curve] { return static_cast<int>(curve().measure); },
                  [&dlg, end](const int& i) {
@@ -36,8 +37,9 @@ void AddPage(CFormView& form, DLG& dlg, HINGE_END end, const std::string& prefix
                  }},
                 KeyTexts({"IDS_RPS_PO_PHGT_FEMA_DDY", "IDS_RPS_PO_PHGT_FEMA_PLS"}))
         .name = prefix + "measure";
-    AutoYieldChoice(form, [curve]() -> bool& { return curve().autoYield; }).name =
-        prefix + "autoYield";
+    AutoYieldChoice(form, {[curve] { return curve().autoYield; },
+                           [&dlg, end](const bool& on) { dlg.OnUserAutoRdo(end, on); }})
+        .name = prefix + "autoYield";
     StiffnessChoice(form, dlg.Which(),
                     {[curve] { return curve().initStiffness; },
                      [curve](const INIT_STIFFNESS& v) { curve().initStiffness = v; }});

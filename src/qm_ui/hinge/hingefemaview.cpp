@@ -1,5 +1,6 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/po_hingefemaenrgdsptgrid.h"
 #include "qm_rps/po_hingeskcvtabfemaaxialgrid.h"
 #include "qm_rps/po_hingeskcvtabfemadlg.h"
 #include "qm_ui/hinge/hingefieldsview.h"
@@ -36,7 +37,7 @@ struct T_FEMA_PAGE {
 T_BACKBONE_PAGE BackboneOf(const T_FEMA_PAGE& p)
 {
     const auto infillName = [p](std::size_t label) {
-        if (!p.Curve().infillStrut) return std::string();
+        if (!p.dlg.IsInfillStrutMode(p.c, p.end)) return std::string();
         return MMSGFunction::GetValue(DLG::InfillLabels(p.Curve().infillGeneral)[label]);
     };
     T_BACKBONE_PAGE page;
@@ -83,6 +84,7 @@ void AddBackbonePage(CFormView& form, const T_FEMA_PAGE& p)
 {
     const T_BACKBONE_PAGE page = BackboneOf(p);
     form.Page(KeyText("IDS_QM_UI_HINGE_BACKBONE"));
+    AddModelNote(form, p.c, p.dlg.m_owner);
     form.Choice(KeyText("IDS_QM_UI_HINGE_MEASURE"),
                 {[p] { return static_cast<int>(p.Curve().measure); },
                  [p](const int& i) {
@@ -90,8 +92,9 @@ void AddBackbonePage(CFormView& form, const T_FEMA_PAGE& p)
                  }},
                 KeyTexts({"IDS_RPS_PO_PHGT_FEMA_DDY", "IDS_RPS_PO_PHGT_FEMA_PLS"}))
         .name = p.prefix + "measure";
-    AutoYieldChoice(form, [p]() -> bool& { return p.Curve().autoYield; }).name =
-        p.prefix + "autoYield";
+    AutoYieldChoice(form, {[p] { return p.Curve().autoYield; },
+                           [p](const bool& on) { p.dlg.OnUserAutoRdo(p.c, p.end, on); }})
+        .name = p.prefix + "autoYield";
     StiffnessChoice(form, p.c, p.Of(&T_SKEL_FEMA::initStiffness));
     form.Columns();
     form.Flag(KeyText("IDS_QM_UI_HINGE_SYMMETRIC"), p.Of(&T_SKEL_FEMA::symmetric));
@@ -148,6 +151,9 @@ void AddEnergy(CFormView& form, const T_FEMA_PAGE& p)
                     p.Is(&T_SKEL_FEMA::energyBased)},
                    sides, [i](T_SKEL_SIDE& s) -> double& { return s.energy[i]; });
     form.EndCells();
+    Set(form.Button(KeyText("IDS_QM_UI_HINGE_ENERGY_BTN"),
+                    [p] { (void)p.dlg.OnEnergyBtn(p.c, p.end); }),
+        p.prefix + "energyTable", p.Is(&T_SKEL_FEMA::energyBased));
     form.EndGroup();
 }
 
@@ -186,7 +192,9 @@ void AddOptionsPage(CFormView& form, const T_FEMA_PAGE& p)
     AddDcRatio(form, p);
     const bool strut = p.dlg.m_owner.type.element == HINGE_ELEMENT::Truss;
     if (!strut) return;
-    form.Flag(KeyText("IDS_RPS_PO_PHGT_SKCV_FEMA_IFST"), p.Of(&T_SKEL_FEMA::infillStrut));
+    form.Flag(KeyText("IDS_RPS_PO_PHGT_SKCV_FEMA_IFST"),
+              {[p] { return p.dlg.IsInfillStrutMode(p.c, p.end); },
+               [p](const bool& on) { p.dlg.SetInfillStrutMode(p.c, p.end, on); }});
     Set(form.Flag(KeyText("IDS_QM_UI_HINGE_INFILL_GENERAL"), p.Of(&T_SKEL_FEMA::infillGeneral)), "",
         p.Is(&T_SKEL_FEMA::infillStrut));
 }
@@ -210,7 +218,8 @@ void BuildFema(CFormView& form, DLG& dlg)
         return found;
     });
     ForEachPage(*dlg.Component(c), [&](HINGE_END end, const T_SKEL_CURVE&) {
-        const T_FEMA_PAGE page{dlg, c, end, end == HINGE_END::J ? "J." : ""};
+        const bool ofJ = dlg.IsNeedIJTab(c) && end == HINGE_END::J;
+        const T_FEMA_PAGE page{dlg, c, end, ofJ ? "J." : ""};
         form.Page(KeyText(PageTitleKey(*dlg.Component(c), end)));
         form.Columns();
         AddBackbonePage(form, page);
@@ -222,6 +231,23 @@ void BuildFema(CFormView& form, DLG& dlg)
         form.EndColumns();
     });
     form.EndPages();
+}
+
+/// A row for each side under the heads of the factors.
+void BuildEnergyGrid(CFormView& form, CPO_HingeFEMAEnrgDsptGrid& dlg)
+{
+    std::vector<TextFn> heads{TextFn()};
+    for (const char* head : CPO_HingeFEMAEnrgDsptGrid::kHeads)
+        heads.push_back(PlainLabel(head));
+    form.Cells(std::move(heads));
+    for (std::size_t side = 0; side < 2; ++side) {
+        const TextFn name = PlainLabel(side == 0 ? "(+)" : "(-)");
+        form.Note(name);
+        for (std::size_t i = 0; i < CPO_HingeFEMAEnrgDsptGrid::kHeads.size(); ++i)
+            form.Number(name, Ref(dlg.m_factors[side][i])).name =
+                FormatText("factors[%zu][%zu]", side, i);
+    }
+    form.EndCells();
 }
 
 void BuildAxialGrid(CFormView& form, CPO_HingeSkcvTabFemaAxialGrid& dlg)
@@ -252,6 +278,7 @@ void BuildAxialGrid(CFormView& form, CPO_HingeSkcvTabFemaAxialGrid& dlg)
 void RegisterHingeFemaViews(CViewFactory& factory)
 {
     factory.Register<DLG>(KeyText("IDS_QM_UI_HINGE_FEMA_TITLE"), BuildFema, {.size = {1150, 0}});
+    factory.Register<CPO_HingeFEMAEnrgDsptGrid>(KeyText("IDS_QM_UI_HINGE_ENERGY"), BuildEnergyGrid);
     factory.Register<CPO_HingeSkcvTabFemaAxialGrid>(KeyText("IDS_QM_UI_HINGE_AXIAL"),
                                                     BuildAxialGrid);
 }

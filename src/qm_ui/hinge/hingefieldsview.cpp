@@ -96,11 +96,17 @@ CFormField& StiffnessChoice(CFormView& form, HINGE_COMPONENT c, T_BINDING<INIT_S
                        [c] { return StiffnessTexts(c); });
 }
 
-CFormField& AutoYieldChoice(CFormView& form, std::function<bool&()> autoYield)
+void AddModelNote(CFormView& form, HINGE_COMPONENT c, const T_HINGE_OWNER& owner)
+{
+    const std::string label = HingeModelLabel(owner.type.definition, c);
+    if (!label.empty()) form.Note(PlainLabel(label)).name = "model";
+}
+
+CFormField& AutoYieldChoice(CFormView& form, T_BINDING<bool> automatic)
 {
     return form.Choice(KeyText("IDS_QM_UI_HINGE_YIELD_FROM"),
-                       {[autoYield] { return autoYield() ? 0 : 1; },
-                        [autoYield](const int& index) { autoYield() = index == 0; }},
+                       {[automatic] { return automatic.get() ? 0 : 1; },
+                        [automatic](const int& index) { automatic.set(index == 0); }},
                        KeyTexts({"IDS_QM_UI_HINGE_AUTOMATIC", "IDS_QM_UI_HINGE_ENTERED"}));
 }
 
@@ -129,6 +135,8 @@ void AddCriteriaCells(CFormView& form, const T_BACKBONE_PAGE& page)
                                           : "IDS_RPS_PO_PHGT_FEMA_ACCPT_PLS");
     };
     form.Group(head);
+    Set(form.Note([] { return CriterionText(false, 0.0); }), "inactive", {},
+        [page] { return page.criteria && !page.criteria(); });
     form.Cells({{}, PlainLabel("(+)"), PlainLabel("(-)")});
     const std::pair<const char*, double T_SKEL_SIDE::*> rows[] = {
         {"IO", &T_SKEL_SIDE::IO}, {"LS", &T_SKEL_SIDE::LS}, {"CP", &T_SKEL_SIDE::CP}};

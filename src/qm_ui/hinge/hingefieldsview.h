@@ -1,7 +1,7 @@
 // Fields that several hinge editors have: the two sides of a curve in a table, choices by key.
 #pragma once
 
-#include "qm_rps/hinge/hingelabels.h"
+#include "qm_rps/hinge/pageyield.h"
 #include "qm_rps/po_hingetypedlg.h"
 #include "qm_ui/form/formview.h"
 
@@ -19,7 +19,9 @@ CFormField& RefChoice(CFormView& form, TextFn caption, T_BINDING<int> key,
 CFormField& StiffnessChoice(CFormView& form, HINGE_COMPONENT c, T_BINDING<INIT_STIFFNESS> option);
 
 /// Yes and no as a choice: yield strengths from section and material, or entered.
-CFormField& AutoYieldChoice(CFormView& form, std::function<bool&()> autoYield);
+CFormField& AutoYieldChoice(CFormView& form, T_BINDING<bool> automatic);
+/// The model of a moment component: rotation or curvature, "Moment - Rotation (M-Ry)".
+void AddModelNote(CFormView& form, HINGE_COMPONENT c, const T_HINGE_OWNER& owner);
 
 /// The value of one side, which `find` finds in it.
 template <class SIDE, class FIND>

@@ -88,7 +88,8 @@ void AddLevel(CFormView& form, SURFACE& dlg, const SURFACE::T_LEVEL& level,
     form.NextColumn();
     form.Picture([&dlg, level] {
         return HingeInteractionPlot(
-            dlg.m_owner.type, *level.level, MMSGFunction::GetValue(level.titleKey), {},
+            dlg.m_owner.type, *level.level, MMSGFunction::GetValue(level.titleKey),
+            dlg.LinesOf(*level.level),
             dlg.m_showValue ? std::optional(dlg.m_owner.units) : std::nullopt);
     });
     form.EndColumns();

@@ -152,6 +152,7 @@ void BuildHingeList(CFormView& form, CPushOverHingeListDlg& dlg)
                     [&dlg](int key) { dlg.OnSelChangeType(key); }),
                 TypeTexts(dlg.Doc()))
         .name = "type";
+    form.Note([&dlg] { return dlg.TypeKind(); }).name = "kind";
     form.Note([&dlg] {
         return MMSGFunction::Format("IDS_QM_UI_HINGE_FOR_ELEMENTS",
                                     {std::to_string(dlg.Elements().size())});
@@ -188,8 +189,18 @@ void AddDiagram(CFormView& form, TABLE& dlg)
         return plastic ? DeformHead("IDS_RPS_PO_PHGT_FEMA_PLS", dlg.ComponentOnShow(), dlg.Owner())
                        : MMSGFunction::GetValue("IDS_RPS_PO_PHGT_FEMA_DDY");
     };
+    form.Choice(KeyText("IDS_QM_UI_HINGE_MEASURE"),
+                {[&dlg] { return dlg.Shown() ? static_cast<int>(dlg.Shown()->measure) : -1; },
+                 [&dlg](const int& i) { (void)dlg.OnMeasureRdo(static_cast<SKEL_MEASURE>(i)); }},
+                KeyTexts({"IDS_RPS_PO_PHGT_FEMA_DDY", "IDS_RPS_PO_PHGT_FEMA_PLS"}))
+        .name = "measure";
+    const auto other = [&dlg] {
+        const bool plastic = dlg.Shown() && dlg.Shown()->measure == SKEL_MEASURE::Plastic;
+        return plastic ? MMSGFunction::GetValue("IDS_RPS_PO_PHGT_FEMA_DDY")
+                       : DeformHead("IDS_RPS_PO_PHGT_FEMA_PLS", dlg.ComponentOnShow(), dlg.Owner());
+    };
     form.Cells({KeyText("IDS_QM_UI_HINGE_POINT"), [head] { return head(false); },
-                [head] { return head(true); }});
+                [head] { return head(true); }, other});
     constexpr std::size_t kOrigin = 4;
     for (std::size_t row = 0; row < TABLE::kRows.size(); ++row) {
         const TextFn name = PlainLabel(TABLE::kRows[row]);
@@ -207,6 +218,8 @@ void AddDiagram(CFormView& form, TABLE& dlg)
                               : field + (member == &T_SKEL_POINT::deform ? "deform" : "strength"),
                 enabled);
         }
+        form.Note([&dlg, row] { return dlg.OtherMeasureText(row); }).name =
+            FormatText("other[%zu]", row);
     }
     form.EndCells();
     form.EndGroup();

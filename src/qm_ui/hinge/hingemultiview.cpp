@@ -188,8 +188,10 @@ T_BINDING<bool> FlagOf(const P& p, bool T_SKEL_MULTI::*member)
 void AddPage(CFormView& form, const P& p)
 {
     form.Note([p] { return zql::lib::MMSGFunction::GetValue(CurveKey(p.dlg.Component().type)); });
-    AutoYieldChoice(form, [p]() -> bool& { return p.Curve().autoYield; }).name =
-        p.prefix + "autoYield";
+    AddModelNote(form, p.dlg.Which(), p.dlg.m_owner);
+    AutoYieldChoice(form, {[p] { return p.Curve().autoYield; },
+                           [p](const bool& on) { p.dlg.OnUserAutoRdo(p.end, on); }})
+        .name = p.prefix + "autoYield";
     StiffnessChoice(form, p.dlg.Which(),
                     {[p] { return p.Curve().initStiffness; },
                      [p](const INIT_STIFFNESS& v) { p.dlg.ChangeInitStiff(p.end, v); }});

@@ -8,6 +8,7 @@ namespace {
 
 void BuildOptions(CFormView& form, CYieldStrengthCalcOptDlg& dlg)
 {
+    form.Note([&dlg] { return dlg.ModeText(); }).name = "mode";
     form.Flag(KeyText("IDS_QM_UI_HINGE_ONLY_THESE"),
               {[&dlg] { return dlg.Data().selectedOnly; },
                [&dlg](const bool& on) { (void)dlg.OnSelectElemChk(on, {}); }})
