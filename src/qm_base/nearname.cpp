@@ -5,7 +5,7 @@
 
 namespace {
 
-constexpr std::size_t kBeginning = 3; // letters that stand for a whole name
+constexpr std::size_t kPart = 3; // letters that stand for a whole name
 
 /// ASCII letters in lower case.
 std::string Plain(std::string_view name)
@@ -52,10 +52,11 @@ std::string NearestName(std::string_view typed, std::span<const std::string_view
         best = distance;
         nearest = name;
     }
-    const auto begins = [&](std::string_view name) { return Plain(name).starts_with(plain); };
-    if (nearest.empty() && plain.size() >= kBeginning) {
-        const auto at = std::ranges::find_if(known, begins);
-        if (at != known.end()) nearest = *at;
+    if (!nearest.empty() || plain.size() < kPart) return std::string(nearest);
+    for (const std::string_view name : known) {
+        const std::size_t at = Plain(name).find(plain);
+        if (at == 0) return std::string(name);
+        if (at != std::string::npos && nearest.empty()) nearest = name;
     }
     return std::string(nearest);
 }

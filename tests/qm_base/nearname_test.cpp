@@ -20,6 +20,7 @@ TEST(NearName, ProposesWhatWasMeantAndNothingFarAway)
         {"w", ""},
         {"", ""},
         {"loads", ""},
+        {"cases", "load_cases"},
     };
     for (const auto& [typed, meant] : rows)
         EXPECT_EQ(meant, NearestName(typed, known)) << typed;

@@ -41,10 +41,12 @@ std::string UnknownKey(const std::string& key, std::span<const std::string_view>
     if (!meant.empty())
         return Say("IDS_QM_JSON_UNKNOWN_KEY_NEAR", QuotedText(key), QuotedText(meant));
     std::string all;
-    for (const std::string_view name : known)
-        all += (all.empty() ? "" : ", ") + std::string(name);
-    if (known.empty() || known.size() > kShortList)
-        return Say("IDS_QM_JSON_UNKNOWN_KEY", QuotedText(key));
+    std::size_t count = 0;
+    for (auto name = known.begin(); name != known.end(); ++name) {
+        if (std::find(known.begin(), name, *name) != name) continue; // asked for twice
+        all += (count++ == 0 ? "" : ", ") + std::string(*name);
+    }
+    if (count == 0 || count > kShortList) return Say("IDS_QM_JSON_UNKNOWN_KEY", QuotedText(key));
     return Say("IDS_QM_JSON_UNKNOWN_KEY_KNOWN", QuotedText(key), all);
 }
 
