@@ -40,6 +40,8 @@ EXIT_CODE RunHingeConvert(const T_HINGE_OPTIONS& options);
 EXIT_CODE RunHingeAxial(const T_HINGE_OPTIONS& options);
 /// Prints options of hinges and design codes; with a file to write it changes them first.
 EXIT_CODE RunHingeModelOptions(const T_HINGE_OPTIONS& options);
+/// The yield level that the type's own section and material give, into its yield surface.
+EXIT_CODE RunHingeSurface(const T_HINGE_OPTIONS& options);
 EXIT_CODE RunHingePlot(const T_HINGE_OPTIONS& options);
 
 /// Checks the pushover load cases and their pattern rows.

@@ -7,8 +7,11 @@
 #include "qm_rps/hinge/hingecontext.h"
 #include "qm_rps/hinge/hingemirror.h"
 #include "qm_rps/hinge/hingetable.h"
+#include "qm_rps/hinge/pageyield.h"
+#include "qm_rps/hinge/sectionstrength.h"
 #include "qm_rps/hingeoptionsdlg.h"
 #include "qm_rps/po_hingeskcvtabfemadlg.h"
+#include "qm_rps/po_hingeyieldpropdlgnew.h"
 
 #ifdef QM_UI
 #include "qm_ui/hinge/hingeplot.h"
@@ -161,6 +164,23 @@ EXIT_CODE RunHingeModelOptions(const T_HINGE_OPTIONS& o)
     PrintLine(Say("IDS_QM_CLI_HINGE_ALPHAS", ratio(options.m_alpha1[0]), ratio(options.m_alpha1[1]),
                   ratio(options.m_alpha2[0]), ratio(options.m_alpha2[1])));
     return edited ? SaveDocument(doc, o.out) : EXIT_CODE::Done;
+}
+
+EXIT_CODE RunHingeSurface(const T_HINGE_OPTIONS& o)
+{
+    CDBDoc doc;
+    int key = 0;
+    T_PHGT_D type;
+    if (const EXIT_CODE code = OpenType(doc, o, OUTPUT_KIND::Document, key, type);
+        code != EXIT_CODE::Done)
+        return code;
+    T_YIELD_SURFACE surface = type.yieldSurface.value_or(T_YIELD_SURFACE{});
+    CPO_HingeYieldPropDlgNew dlg(surface, YieldSurfaceCurve(type));
+    dlg.m_calculated = CalculatedLevel({type, doc.Unit().Units(), HingeContextOf(doc).sources});
+    if (!dlg.OnCalculateBtn())
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_NO_LEVEL", o.file, o.type));
+    type.yieldSurface = dlg.m_surface;
+    return StoreType(doc, key, type, o.out, Say("IDS_QM_CLI_HINGE_SURFACE", o.type));
 }
 
 EXIT_CODE RunHingePlot(const T_HINGE_OPTIONS& o)

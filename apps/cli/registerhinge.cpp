@@ -63,6 +63,11 @@ void AddHingeCommands(CLI::App& app, EXIT_CODE& code)
     options->add_option("--alpha2", o->alpha2, Say("IDS_QM_HELP_HINGE_ALPHA"))->expected(2);
     options->add_option("-o", o->out, Say("IDS_QM_HELP_TO_WRITE"));
     AddOverwrite(options, o->overwrite);
+    auto* surface = AddOne(hinges, "surface", Say("IDS_QM_HELP_HINGE_SURFACE"),
+                           " --type \"steel column\" -o surface.json", o, RunHingeSurface);
+    type(surface, true);
+    surface->add_option("-o", o->out, Say("IDS_QM_HELP_TO_WRITE"))->required();
+    AddOverwrite(surface, o->overwrite);
     auto* plot = AddOne(hinges, "plot", Say("IDS_QM_HELP_HINGE_PLOT"),
                         " --type \"steel beam\" --component My -o hinge.svg", o, RunHingePlot);
     type(plot, true);

@@ -86,7 +86,10 @@ void CPO_HingeSkcvTabFemaDlg::OnEdited()
         if (!component) continue;
         const auto c = static_cast<HINGE_COMPONENT>(i);
         ForEachPage(*component, [&](HINGE_END end, T_SKEL_CURVE& curve) {
-            PutCalculated(Calculated(c, end), component->type, curve);
+            const T_PAGE_VALUES values = Calculated(c, end);
+            if (values.yield.pos && values.yield.neg)
+                SetAutoCalcValue(c, end, {*values.yield.pos, *values.yield.neg});
+            PutCalculated({{}, values.deform}, component->type, curve);
         });
         *component = MirroredComponent(*component);
     }

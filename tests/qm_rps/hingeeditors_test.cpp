@@ -4,6 +4,7 @@
 #include "qm_rps/hinge/hingelabels.h"
 #include "qm_rps/hinge/hingetable.h"
 #include "qm_rps/po_hingefemaenrgdsptgrid.h"
+#include "qm_rps/po_hingeskcvtabdlg.h"
 #include "qm_rps/po_hingeskcvtabeurodlg.h"
 #include "qm_rps/po_hingeskcvtabfemadlg.h"
 #include "qm_rps/po_hingeyieldpropdlgnew.h"
@@ -176,4 +177,54 @@ TEST(HingeEditors, TheOlderTableShowsTheOtherMeasureAndSwitches)
     EXPECT_EQ("-", table.OtherMeasureText(0));
     EXPECT_EQ(0, table.OnMeasureRdo(SKEL_MEASURE::Plastic)) << "every value would become 0";
     EXPECT_EQ(SKEL_MEASURE::DDy, table.Shown()->measure);
+}
+
+// Zy fy = 300, A fy = 200; 6 E I / span = 100, so that the rotation is 3.
+TEST(HingeEditors, AutomaticPagesShowWhatTheTypesOwnSectionGives)
+{
+    T_SECT_D section;
+    section.area = 2, section.Asy = section.Asz = section.J = section.Izz = section.Zz = 1;
+    section.Iyy = 2, section.Zy = 3;
+    T_MATL_D steel;
+    steel.Fy = 100, steel.E = 100;
+    T_HINGE_OWNER owner;
+    owner.sources = std::make_shared<CHingeSources>(T_TABLE<T_SECT_D>{{1, section}},
+                                                    T_TABLE<T_MATL_D>{{1, steel}}, owner.units);
+    const auto fema = [&](double& deform) {
+        CPO_HingeSkcvTabFemaDlg dlg;
+        dlg.m_owner = owner;
+        EXPECT_TRUE(
+            dlg.Data2Dlg(HINGE_COMPONENT::My, ComponentWith(SKEL_TYPE::Fema, T_SKEL_FEMA())));
+        dlg.OnEdited();
+        const T_SKEL_SIDE& neg = dlg.Curve(HINGE_COMPONENT::My, HINGE_END::Both)->sides.neg;
+        deform = neg.yieldDeform;
+        return neg.yield;
+    };
+    double deform = 0.0;
+    EXPECT_EQ(0.0, fema(deform)); // the type has no section: each element has its own
+    owner.type.section = owner.type.sectionMaterial = 1;
+    EXPECT_DOUBLE_EQ(300.0, fema(deform));
+    EXPECT_EQ(0.0, deform); // each element has its own length
+    owner.type.length.autoSpan = false, owner.type.length.span = 12;
+    EXPECT_DOUBLE_EQ(300.0, fema(deform));
+    EXPECT_DOUBLE_EQ(3.0, deform);
+
+    CPO_HingeSkcvTabDlg multi;
+    multi.m_owner = owner;
+    multi.m_owner.type.components[4].type = SKEL_TYPE::Trilinear;
+    ASSERT_TRUE(
+        multi.Data2Dlg(HINGE_COMPONENT::My, ComponentWith(SKEL_TYPE::Trilinear, T_SKEL_MULTI())));
+    multi.OnEdited();
+    EXPECT_DOUBLE_EQ(300.0, multi.Curve(HINGE_END::Both)->sides.pos.P2);
+    EXPECT_EQ(0.0, multi.Curve(HINGE_END::Both)->sides.pos.P1); // is entered
+
+    T_YIELD_SURFACE surface;
+    surface.yield.z.used = false;
+    CPO_HingeYieldPropDlgNew dlg(surface, SKEL_TYPE::Fema);
+    EXPECT_FALSE(dlg.OnCalculateBtn());
+    dlg.m_calculated = CalculatedLevel(owner);
+    ASSERT_TRUE(dlg.OnCalculateBtn());
+    EXPECT_DOUBLE_EQ(200.0, dlg.m_surface.yield.compression);
+    EXPECT_DOUBLE_EQ(300.0, dlg.m_surface.yield.y.moment.neg);
+    EXPECT_FALSE(dlg.m_surface.yield.z.used);
 }

@@ -2,6 +2,7 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_rps/hinge/hingetheta.h"
+#include "qm_rps/hinge/pageyield.h"
 
 #include <algorithm>
 
@@ -131,8 +132,7 @@ T_SIDES<std::optional<double>> StiffnessOf(const CURVE& curve, HINGE_COMPONENT c
     const auto stiffness = [&](const auto& side) {
         return CHingeTheta::CalcStiffness(lookup, c, at, curve.initStiffness, side.userStiffness);
     };
-    bool two = !curve.symmetric;
-    if constexpr (requires { curve.asymStiffness; }) two = curve.asymStiffness;
+    const bool two = HasTwoStiffnesses(curve);
     return {stiffness(curve.sides.pos), stiffness(two ? curve.sides.neg : curve.sides.pos)};
 }
 
@@ -249,12 +249,10 @@ T_PART_STATES PartStates(const T_PHGT_D& type, bool altHysteresis)
 std::vector<T_STIFFNESS_ROW> StiffnessRows(const T_PHGT_D& type, const T_HINGE_CONTEXT& context,
                                            double memberLength)
 {
-    T_THETA_LOOKUP lookup;
-    lookup.memberLength = type.length.autoSpan ? memberLength : type.length.span;
-    if (context.sources) {
-        lookup.section = context.sources->Section(type.section);
-        lookup.material = context.sources->Material(type.sectionMaterial);
-    }
+    const CHingeSources* from = context.sources.get();
+    const T_THETA_LOOKUP lookup =
+        LookupOf(type, from ? from->Section(type.section) : nullptr,
+                 from ? from->Material(type.sectionMaterial) : nullptr, memberLength);
     std::vector<T_STIFFNESS_ROW> rows;
     for (std::size_t i = 0; i < type.components.size(); ++i) {
         if (!type.components[i].active) continue;

@@ -216,9 +216,10 @@ TEST(HingeTypeFindings, PartsOfTheTypeAreCheckedUnderTheirNames)
             {"crack strength above the calculated one, Zy fy = 550",
              [](T& t) {
                  T_SKEL_MULTI m;
+                 m.symmetric = false;
                  m.sides.pos.P1 = 550.001, m.sides.neg.P1 = 550;
                  t.components[4] = ComponentWith(SKEL_TYPE::Trilinear, m);
-                 t.section = t.sectionMaterial = 1, m.symmetric = false;
+                 t.section = t.sectionMaterial = 1;
              },
              kHingeItemMessage, "sides.pos.P1"},
             {"surface without axes",
