@@ -75,12 +75,9 @@ T_LONG PullSize(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& s,
 T_LONG Units(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& s, const T_LONG& y,
              std::span<const long double> multipliers)
 {
-    if (s.isByWeight && problem.objective == 2 && !HasFree(s))
-        return T_LONG(s.nVar, std::max(1.0L, Norm(y)));
+    if (s.isByWeight && problem.objective != 2) return T_LONG(s.nVar, 1.0L);
+    if (s.isByWeight && !HasFree(s)) return T_LONG(s.nVar, std::max(1.0L, Norm(y)));
     T_LONG units = PullSize(problem, s, multipliers);
-    for (long double& unit : units)
-        if (s.isByWeight && problem.objective != 2) unit = 1.0L + kOfTerms * unit;
-    if (s.isByWeight && problem.objective != 2) return units;
     const long double nothing = (HasFree(s) ? kNothingBesideFree : kNothing) * Norm(y);
     for (std::size_t j = 0; j < s.nVar; ++j) {
         const long double own = problem.objective == 2 ? s.cost[j] * std::fabs(y[j]) : 1.0L;

@@ -10,6 +10,7 @@ constexpr double kLargestRhs = 1e300; // beyond it a scaled right-hand side is n
 constexpr long double kNoise = 1e-17L; // part of the largest factor that is rounding
 
 constexpr int kSweeps = 6;                 // of the equilibration
+constexpr int kNoExponent = -100000;       // of a zero
 constexpr long double kLeastSize = 1e-40L; // of a column, against the largest, both by weight
 
 bool AllFinite(std::span<const double> values)
@@ -99,23 +100,30 @@ std::vector<long double> UlfWeights(std::span<const double> weights)
 
 std::vector<long double> UlfColumnSizes(const T_ULF_PROBLEM& p)
 {
+    // Powers of two: what is compared are the exponents of the entries.
     const auto n = static_cast<std::size_t>(p.nVar);
-    std::vector<long double> row(p.Rows(), 1.0L), size(n, 1.0L);
+    std::vector<int> exponents;
+    exponents.reserve(p.coefficients.size());
+    for (const double entry : p.coefficients)
+        exponents.push_back(std::fabs(entry) > 0.0 ? std::ilogb(entry) : kNoExponent);
+    std::vector<int> column(n, 0);
     for (int sweep = 0; sweep < kSweeps; ++sweep) {
+        std::vector<int> most(n, kNoExponent);
         for (std::size_t i = 0; i < p.Rows(); ++i) {
-            long double most = 0.0L;
+            const std::span<const int> row = std::span(exponents).subspan(i * n, n);
+            int size = kNoExponent;
             for (std::size_t j = 0; j < n; ++j)
-                most = std::max(most, std::fabs(p.Row(i)[j] / size[j]));
-            row[i] = most > 0.0L ? most : 1.0L;
+                size = std::max(size, row[j] - column[j]);
+            for (std::size_t j = 0; j < n; ++j)
+                if (row[j] != kNoExponent) most[j] = std::max(most[j], row[j] - size);
         }
-        for (std::size_t j = 0; j < n; ++j) {
-            long double most = 0.0L;
-            for (std::size_t i = 0; i < p.Rows(); ++i)
-                most = std::max(most, std::fabs(p.Row(i)[j] / row[i]));
-            size[j] = most > 0.0L ? most : 1.0L;
-        }
+        for (std::size_t j = 0; j < n; ++j)
+            if (most[j] != kNoExponent) column[j] = most[j];
     }
-    return FittedToWeights(p, std::move(size));
+    std::vector<long double> sizes;
+    for (const int exponent : column)
+        sizes.push_back(std::exp2(static_cast<long double>(exponent)));
+    return FittedToWeights(p, std::move(sizes));
 }
 
 T_ULF_SCALED ScaleUlf(const T_ULF_PROBLEM& problem)
