@@ -4,7 +4,6 @@
 #include "inputfile.h"
 #include "output.h"
 #include "qm_base/say.h"
-#include "qm_base/textformat.h"
 #include "qm_rps/factors/checks/ulfitemchecks.h"
 #include "qm_rps/factors/checks/ulfstagechecks.h"
 #include "qm_rps/factors/ulfstageresults.h"
@@ -174,25 +173,6 @@ void PrintHistory(const CUlfIteration& run)
                     Say(rows[i].pretension ? "IDS_QM_CLI_YES" : "IDS_QM_CLI_NO").c_str());
 }
 
-/// Start, factor and final pretension of each stay, and its force in the last stage.
-void PrintStays(const T_ITERATE_RESULT& r)
-{
-    if (r.stays.empty()) return;
-    const std::string unit(NameOf(r.units.force));
-    const auto in = [&](const char* key) { return Say(key) + " " + unit; };
-    std::printf("\n%8s  %-16s %16s %12s %16s %16s\n", Say("IDS_QM_CLI_ELEMENT").c_str(),
-                Say("IDS_QM_CLI_LOAD_CASE").c_str(), in("IDS_QM_CLI_STAY_START").c_str(),
-                Say("IDS_QM_CLI_FACTOR").c_str(), in("IDS_QM_CLI_STAY_NOW").c_str(),
-                in("IDS_QM_CLI_STAY_FORCE").c_str());
-    const auto text = [](const std::optional<double>& v) {
-        return v ? FormatText("%.7g", *v + 0.0) : std::string("-");
-    };
-    for (const T_ULF_STAY& s : r.stays)
-        std::printf("%8d  %-16s %16s %12s %16s %16s\n", s.element, s.load.c_str(),
-                    text(s.start).c_str(), text(s.Factor()).c_str(), text(s.now).c_str(),
-                    text(s.force).c_str());
-}
-
 void PrintAnalysed(const T_ITERATE_RESULT& r)
 {
     if (r.analysed.empty()) return;
@@ -243,7 +223,7 @@ EXIT_CODE WriteResults(const CUlfIteration& run, const T_ITERATE_OPTIONS& o,
     }
     if (o.json != "-") {
         PrintHistory(run);
-        PrintStays(result);
+        std::printf("%s", StayTable(result.stays, result.units).c_str());
         PrintAnalysed(result);
     }
 #ifdef QM_UI

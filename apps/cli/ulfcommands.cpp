@@ -244,7 +244,10 @@ EXIT_CODE RunUlfSolve(const T_ULF_OPTIONS& o)
         if (code != EXIT_CODE::Done) return code;
     }
     if (!result) return outcome.code;
-    if (o.json != "-") std::printf("%s", UlfTables(*result).c_str());
+    const CUnknownLoadFactorResultDlg dialog(in.doc, *result);
+    if (o.json != "-")
+        std::printf("%s%s", UlfTables(*result).c_str(),
+                    StayTable(dialog.Stays(), in.doc.Data().Units()).c_str());
     const EXIT_CODE drawn = DrawPictures(in.doc, *result, o);
     return drawn == EXIT_CODE::Done ? outcome.code : drawn;
 }

@@ -163,3 +163,20 @@ std::string UlfTables(const T_ULF_RESULT& r)
     if (r.linearForecast) text += Say("IDS_QM_ULF_LINEAR_FORECAST") + "\n";
     return text;
 }
+
+std::string StayTable(const std::vector<T_ULF_STAY>& stays, const T_UNITS& units)
+{
+    if (stays.empty()) return {};
+    const std::string unit(NameOf(units.force));
+    const auto in = [&](const char* key) { return Say(key) + " " + unit; };
+    std::string text =
+        FormatText("\n%8s  %-16s %16s %12s %16s %16s\n", Say("IDS_QM_CLI_ELEMENT").c_str(),
+                   Say("IDS_QM_CLI_LOAD_CASE").c_str(), in("IDS_QM_CLI_STAY_START").c_str(),
+                   Say("IDS_QM_CLI_FACTOR").c_str(), in("IDS_QM_CLI_STAY_NOW").c_str(),
+                   in("IDS_QM_CLI_STAY_FORCE").c_str());
+    for (const T_ULF_STAY& s : stays)
+        text += FormatText("%8d  %-16s %16s %12s %16s %16s\n", s.element, s.load.c_str(),
+                           Short(s.start).c_str(), Short(s.Factor()).c_str(), Short(s.now).c_str(),
+                           Short(s.force).c_str());
+    return text;
+}

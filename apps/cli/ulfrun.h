@@ -2,6 +2,7 @@
 #pragma once
 
 #include "exitcodes.h"
+#include "qm_rps/factors/ulfanalysed.h"
 #include "qm_rps/factors/ulfexplain.h"
 #include "qm_rps/ulfitemdialog.h"
 
@@ -43,3 +44,6 @@ T_ULF_OUTCOME SolveUlf(CUlfItemDialog& dialog);
 
 /// Tables of the factors and of the constraints.
 std::string UlfTables(const T_ULF_RESULT& result);
+
+/// Start, factor and pretension of each stay, and its force; nothing without stays.
+std::string StayTable(const std::vector<T_ULF_STAY>& stays, const T_UNITS& units);

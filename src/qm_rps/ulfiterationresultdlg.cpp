@@ -23,3 +23,24 @@ std::string UlfIterCellText(const T_ULF_ITER_ROW& row, std::size_t column)
         return row.pretension ? "1" : "0";
     }
 }
+
+std::string UlfStayText(const T_ULF_STAY& stay, std::size_t column)
+{
+    const auto number = [](const std::optional<double>& value) {
+        return value ? FormatText("%.7g", *value + 0.0) : std::string();
+    };
+    switch (column) {
+    case 0:
+        return std::to_string(stay.element);
+    case 1:
+        return stay.load;
+    case 2:
+        return number(stay.start);
+    case 3:
+        return number(stay.Factor());
+    case 4:
+        return number(stay.now);
+    default:
+        return number(stay.force);
+    }
+}

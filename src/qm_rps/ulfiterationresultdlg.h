@@ -2,6 +2,7 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
+#include "qm_rps/factors/ulfanalysed.h"
 #include "qm_rps/factors/ulfiterationreport.h"
 
 #include <array>
@@ -27,3 +28,9 @@ private:
 
 /// Text of a cell of the table of unknowns; factors with nine digits, the flag as "1" and "0".
 std::string UlfIterCellText(const T_ULF_ITER_ROW& row, std::size_t column);
+
+/// Heads of the table of stays, and its cells with seven digits.
+inline constexpr std::array<const char*, 6> kUlfStayHeads{
+    "IDS_QM_UI_ULF_ELEMENT", "IDS_RPS_GXGRID_LCase", "IDS_QM_CLI_STAY_START",
+    "IDS_RPS_GXGRID_Factor", "IDS_QM_CLI_STAY_NOW",  "IDS_QM_CLI_STAY_FORCE"};
+std::string UlfStayText(const T_ULF_STAY& stay, std::size_t column);

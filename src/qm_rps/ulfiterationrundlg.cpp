@@ -283,25 +283,6 @@ std::string CUlfIterationRunDlg::AnalysedText(std::size_t row, std::size_t colum
     }
 }
 
-std::string CUlfIterationRunDlg::StayText(std::size_t row, std::size_t column) const
-{
-    const T_ULF_STAY& s = m_stays.at(row);
-    switch (column) {
-    case 0:
-        return std::to_string(s.element);
-    case 1:
-        return s.load;
-    case 2:
-        return NumberText(s.start);
-    case 3:
-        return NumberText(s.Factor());
-    case 4:
-        return NumberText(s.now);
-    default:
-        return NumberText(s.force);
-    }
-}
-
 std::string CUlfIterationRunDlg::ForceUnit() const
 {
     return std::string(NameOf(m_doc.Data().Units().force));

@@ -24,13 +24,10 @@ public:
         "IDS_RPS_GXGRID_Stage", "IDS_RPS_GXGRID_LCase", "IDS_RPS_GXGRID_Factor",
         "IDS_QM_ULSI_HEAD_PRETENSION", "IDS_QM_UI_ULF_APPLIED"};
 
-    /// Columns of the constraints in the analysed structure, and of the scaled elements.
+    /// Columns of the constraints in the analysed structure.
     static constexpr std::array<const char*, 5> kAnalysedHeads{
         "IDS_RPS_UNKNOWN_LOAD_GXRESULT_Constraint", "IDS_QM_CLI_FORECAST", "IDS_QM_CLI_ANALYSED",
         "IDS_QM_CLI_DIFFERENCE", "IDS_QM_UI_ULF_UNIT"};
-    static constexpr std::array<const char*, 6> kStayHeads{
-        "IDS_QM_UI_ULF_ELEMENT", "IDS_RPS_GXGRID_LCase", "IDS_QM_CLI_STAY_START",
-        "IDS_RPS_GXGRID_Factor", "IDS_QM_CLI_STAY_NOW",  "IDS_QM_CLI_STAY_FORCE"};
 
     /// On the stored items of the model, of which one is chosen (0: the first).
     explicit CUlfIterationRunDlg(CDBDoc& doc, int item = 0);
@@ -68,7 +65,6 @@ public:
     const std::vector<T_ULF_ANALYSED>& Analysed() const { return m_analysed; }
     const std::vector<T_ULF_STAY>& Stays() const { return m_stays; }
     std::string AnalysedText(std::size_t row, std::size_t column) const;
-    std::string StayText(std::size_t row, std::size_t column) const;
     std::string ForceUnit() const;
     /// Shows the window of the latest solution's result. 0: there is none.
     [[nodiscard]] int OnShowResult();

@@ -49,6 +49,30 @@ std::string CUnknownLoadFactorResultDlg::UnitOf(std::size_t i) const
     return RowAt(i).unit;
 }
 
+std::vector<T_ULF_STAY> CUnknownLoadFactorResultDlg::Stays() const
+{
+    std::vector<T_ULF_STAY> stays;
+    T_LCOM_D all;
+    for (std::size_t j = 0; j < m_result.cases.size(); ++j)
+        all.items.push_back({false, m_result.cases[j].key, m_result.factors[j]});
+    const bool hasForces = !m_result.stage && m_doc.Post().SelectLoadCombNew(all);
+    for (std::size_t j = 0; j < m_result.cases.size(); ++j) {
+        const T_ULF_CASE& c = m_result.cases[j];
+        T_STLD_D load;
+        if (!c.unknown || !m_doc.Attr().GetStld(c.key, load)) continue;
+        for (const auto& [element, start] : PretensionByElement(load)) {
+            stays.push_back({element, load.name, start, start * m_result.factors[j]});
+            double axial = 0.0;
+            T_DOF6 forces{};
+            if (hasForces && m_doc.Post().GetStrtNew(element, axial))
+                stays.back().force = axial;
+            else if (hasForces && m_doc.Post().GetStrbNew(element, 0, forces))
+                stays.back().force = forces[0];
+        }
+    }
+    return stays;
+}
+
 std::string CUnknownLoadFactorResultDlg::Notice() const
 {
     return m_result.linearForecast ? MMSGFunction::GetValue("IDS_QM_ULF_LINEAR_FORECAST")

@@ -4,6 +4,7 @@
 
 #include "qm_base/mdialog.h"
 #include "qm_db/dbdoc.h"
+#include "qm_rps/factors/ulfanalysed.h"
 #include "qm_rps/factors/ulfsheet.h"
 
 class CUnknownLoadFactorResultDlg : public zql::frx::MDialog {
@@ -44,6 +45,10 @@ public:
     STATE StateOf(std::size_t constraint) const;
     /// Unit of a constraint's value.
     std::string UnitOf(std::size_t constraint) const;
+    /// Elements with initial tensions in the unknown load cases: the tension as it stands in the
+    /// case, times the factor, and of a static item the axial force under all cases.
+    std::vector<T_ULF_STAY> Stays() const;
+    std::string ForceUnit() const { return std::string(NameOf(m_doc.Data().Units().force)); }
     /// What is to be said about the values, if anything.
     std::string Notice() const;
     /// Title of the model.

@@ -74,7 +74,7 @@ TEST_F(Iterate, KeepsTheSignOfARestrictedFactor)
     ExpectHolds(run.out, {"S1/First Step"});
     // No negative tension holds the node: nothing is written.
     std::filesystem::remove(m_folder / "m.ulf");
-    const T_RUN none = Item("SIGN");
+    const T_RUN none = Item("SIGN --overwrite");
     EXPECT_EQ(1, none.code);
     ExpectHolds(none.err, {"no factors found"});
     EXPECT_FALSE(std::filesystem::exists(m_folder / "m.ulf"));
@@ -165,7 +165,7 @@ TEST_F(Iterate, TheAnalysedStructureStandsBesideTheForecast)
         ExpectHolds(run.err, {c.warning, "the analysed structure is not the one"});
         ExpectHolds(run.out, {"HOLD (S1/Last Step)", "differs"});
         EXPECT_EQ("analysed structure differs", Result().at("status"));
-        const json& row = Result().at("analysed").at(0);
+        const json row = Result().at("analysed").at(0);
         EXPECT_NEAR(0.0, row.at("forecast"), 1e-9);
         EXPECT_NEAR(c.analysed, row.at("analysed"), 1e-9);
         EXPECT_EQ("m", row.at("unit"));

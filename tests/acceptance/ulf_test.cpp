@@ -6,6 +6,7 @@
 
 #include <functional>
 #include <set>
+#include <sstream>
 
 namespace {
 
@@ -133,6 +134,27 @@ TEST_F(Ulf, TheCombinationGivesTheConstraintValues)
     Done("ulf combine m.qmdb --item BOUNDS --name TUNED");
     EXPECT_EQ(shape.at("truss"), Json("analyse m.qmdb --case TUNED").at("truss"));
     EXPECT_EQ(solved, Json("ulf solve m.qmdb --item BOUNDS")) << "the results are not older";
+}
+
+// Stay 107 is at its bound of 3348 kN; a unit load is 1 kN.
+TEST_F(Ulf, StaysAreListedWithTheirUnitAndForces)
+{
+    const std::string out = Done("ulf solve @cable-stayed-bridge --item BOUNDS");
+    ExpectHolds(out, {"start kN", "pretension kN", "force kN"});
+    const json factors = Json("ulf solve @cable-stayed-bridge --item BOUNDS").at("factors");
+    bool found = false;
+    for (const std::string& line : Lines(out)) {
+        std::istringstream words(line);
+        std::string element, load;
+        double start = 0.0, factor = 0.0, now = 0.0, force = 0.0;
+        if (!(words >> element >> load >> start >> factor >> now >> force) || element != "107")
+            continue;
+        found = true;
+        EXPECT_EQ(1.0, start);
+        EXPECT_NEAR(factors.at("T107"), now, 1e-3);
+        EXPECT_NEAR(3348.0, force, 1e-2);
+    }
+    EXPECT_TRUE(found);
 }
 
 #ifdef QM_UI

@@ -1,5 +1,6 @@
 #include "qm_rps/unknownloadfactorresultdlg.h"
 
+#include "scriptview.h"
 #include "tempfolder.h"
 #include "ulfdocument.h"
 
@@ -70,4 +71,21 @@ TEST_F(UnknownLoadFactorResult, ExportsTheSheetOrSaysWhyNot)
     EXPECT_EQ(0, old.OnExport(folder / "old.xlsx", {11, 0, 0, 0, {}}));
     EXPECT_EQ("IDS_RPS_UNKNOWN_LOAD_EXCEED_COLUMN_ERROR", old.Messages().back().key);
     EXPECT_EQ(1u, folder.Names().size());
+}
+
+TEST_F(UnknownLoadFactorResult, FactorsThatMissConstraintsAreWrittenOnlyWhenThePersonWantsIt)
+{
+    m_result.constraints.at(0).upper = m_result.constraints.at(0).lower = 1.0; // it is 0
+    const CTempFolder folder;
+    CScriptView view;
+    for (const bool yes : {false, true}) {
+        view.m_yes = yes;
+        CUnknownLoadFactorResultDlg dlg(m_doc, m_result);
+        dlg.SetView(&view);
+        dlg.m_combinationName = "N";
+        EXPECT_EQ(yes, dlg.OnMakeCombination() == 1);
+        EXPECT_EQ(yes, dlg.OnExport(folder / "s.xlsx", {}) == 1);
+        EXPECT_EQ(yes ? 1U : 0U, folder.Names().size());
+    }
+    EXPECT_EQ(2U, m_doc.Data().Model().combinations.size());
 }

@@ -67,7 +67,8 @@ int CompareWithAnalysis(const T_ULF_RUN& run, const T_ULF_RESULT& result, const 
         if (!place) return 0;
         T_ULF_ANALYSED a;
         a.name = c.name;
-        a.place = UlfPlaceText(data, place->first, place->second);
+        a.place = c.stage != 0 ? UlfPlaceText(data, c.stage, c.step)
+                               : UlfPlaceText(data, place->first, place->second);
         a.unit = UlfUnitText(c.type, c.component, data.Units());
         a.forecast = UlfValue(result, i);
         if (!results.SelectSum(SumOfAll(), place->first, place->second) ||
@@ -86,6 +87,14 @@ std::optional<double> T_ULF_STAY::Factor() const
     return start != 0.0 ? std::optional(now / start) : std::nullopt; // 0 as it was entered
 }
 
+std::map<int, double> PretensionByElement(const T_STLD_D& load)
+{
+    std::map<int, double> sums;
+    for (const T_PTNS_D& p : load.pretension)
+        sums[p.element] += p.force;
+    return sums;
+}
+
 ULF_PRETENSION PretensionOf(const T_ULSI_D& item, const CDataCtrl& data)
 {
     ULF_PRETENSION all;
@@ -93,10 +102,7 @@ ULF_PRETENSION PretensionOf(const T_ULSI_D& item, const CDataCtrl& data)
         for (const int loadCase : LoadsScaledBy(data.Model(), row)) {
             T_STLD_D load;
             if (!CAttrCtrl(data).GetStld(loadCase, load)) continue;
-            std::map<int, double> sums; // several tensions of one element count as one
-            for (const T_PTNS_D& p : load.pretension)
-                sums[p.element] += p.force;
-            for (const auto& [element, force] : sums)
+            for (const auto& [element, force] : PretensionByElement(load))
                 all[{loadCase, element}] = force;
         }
     return all;

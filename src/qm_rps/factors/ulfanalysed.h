@@ -38,11 +38,14 @@ struct T_ULF_STAY {
     std::string load; // name of the load case with its pretension
     double start = 0.0;
     double now = 0.0;
-    std::optional<double> force{}; // axial force at the end of the last stage; empty: not analysed
+    std::optional<double> force{}; // axial force with it (in stages: at the end of the last one)
     /// By what the pretension has been multiplied; empty: it was 0.
     std::optional<double> Factor() const;
     bool operator==(const T_ULF_STAY&) const = default;
 };
+
+/// Initial tensions of a load case; several of one element count as one.
+std::map<int, double> PretensionByElement(const T_STLD_D& load);
 
 /// Pretension of the elements that the item's unknowns scale, by load case and element.
 using ULF_PRETENSION = std::map<std::pair<int, int>, double>;

@@ -43,6 +43,7 @@ public:
             TellFailure();
         }
         TellMatrix();
+        if (m_run.linearForecast) Tell("IDS_QM_ULF_LINEAR_FORECAST", {});
         return 1;
     }
 

@@ -125,9 +125,11 @@ T_GRID_BINDING AnalysedGrid(RUN& run)
 T_GRID_BINDING StayGrid(RUN& run)
 {
     T_GRID_BINDING b;
-    b.columns = UlfColumns(RUN::kStayHeads, {kNumber, kText, kNumber, kNumber, kNumber, kNumber});
+    b.columns = UlfColumns(kUlfStayHeads, {kNumber, kText, kNumber, kNumber, kNumber, kNumber});
     b.rows = [&run] { return run.Stays().size(); };
-    b.text = [&run](std::size_t row, std::size_t column) { return run.StayText(row, column); };
+    b.text = [&run](std::size_t row, std::size_t column) {
+        return UlfStayText(run.Stays().at(row), column);
+    };
     return b;
 }
 

@@ -1,10 +1,14 @@
 #include "qm_ui/factors/ulfresultview.h"
 
+#include "qm_base/msgfunction.h"
 #include "qm_rps/ulfexplanationdlg.h"
+#include "qm_rps/ulfiterationresultdlg.h"
 #include "qm_rps/unknownloadfactorresultdlg.h"
 #include "qm_ui/factors/ulfplot.h"
 
 #include <QDate>
+
+using zql::lib::MMSGFunction;
 
 namespace {
 
@@ -38,6 +42,17 @@ T_GRID_BINDING ConstraintGrid(const RESULT& result)
                : state == RESULT::STATE::Active ? CELL_TONE::Notice
                                                 : CELL_TONE::Plain;
     };
+    return b;
+}
+
+/// Stays with their tensions and forces; empty where no unknown has any.
+T_GRID_BINDING StayGrid(const RESULT& result)
+{
+    const auto stays = std::make_shared<std::vector<T_ULF_STAY>>(result.Stays());
+    T_GRID_BINDING b;
+    b.columns = UlfColumns(kUlfStayHeads, {kNumber, kText, kNumber, kNumber, kNumber, kNumber});
+    b.rows = [stays] { return stays->size(); };
+    b.text = [stays](std::size_t row, std::size_t c) { return UlfStayText(stays->at(row), c); };
     return b;
 }
 
@@ -88,6 +103,13 @@ void BuildResult(CFormView& form, RESULT& result, const T_ULF_HOOKS& hooks)
     AddUlfGrid(form, ConstraintGrid(result), {760, 300});
     form.EndColumns();
     form.Note([&result] { return result.Notice(); });
+    if (!result.Stays().empty()) {
+        form.Page(KeyText("IDS_QM_UI_ULF_STAY_PAGE"));
+        form.Note([&result] {
+            return MMSGFunction::Format("IDS_QM_UI_ULF_STAYS", {result.ForceUnit()});
+        });
+        AddUlfGrid(form, StayGrid(result), {760, 300});
+    }
     form.Page(KeyText("IDS_QM_UI_ULF_PICTURE"));
     AddUlfPicture(form, [&result] { return UlfPlot(UlfPictureOf(result)); });
     form.EndPages();
