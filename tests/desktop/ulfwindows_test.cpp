@@ -164,7 +164,7 @@ TEST_F(UlfWindows, RowsOfAStageItemAreAddedJudgedAndDeleted)
         EXPECT_TRUE(rows.index(3, 1).data(Qt::ToolTipRole).toString().contains("row 4"));
         EXPECT_TRUE(SetCell(rows, 3, 1, "G1"));
         EXPECT_TRUE(SetCell(rows, 3, 4, "0.25"));
-        EXPECT_TRUE(SetCell(rows, 3, 7, "Dead load"));
+        EXPECT_TRUE(SetCell(rows, 3, 7, "0: sum of the dead load"));
         ChooseRow(w, 2);
         Press("IDS_QM_UI_ULF_DELETE_ROW")(w);
         w.accept();
