@@ -322,13 +322,18 @@ EXIT_CODE RunUlfCombine(const T_ULF_OPTIONS& o)
     dialog.m_force = o.force;
     dialog.m_combinationName = o.name;
     (void)TakeMessageHistory(); // what the calculation has left
+    const auto& combinations = in.doc.Data().Model().combinations;
+    const std::size_t before = combinations.size();
     const int made = dialog.OnMakeCombination();
-    const std::vector<std::string> history = TakeMessageHistory();
-    for (std::size_t i = 0; !made && i < history.size(); ++i)
-        Complain(EXIT_CODE::Usage, history[i]);
-    if (!made) return EXIT_CODE::Usage;
-    const EXIT_CODE saved = SaveDocument(in.doc, o.out.empty() ? o.file : o.out);
-    for (std::size_t i = 0; saved == EXIT_CODE::Done && i < history.size(); ++i)
-        std::printf("%s\n", history[i].c_str());
-    return saved;
+    // Of a set that is split the parts that could be added stand, and are saved with their lines.
+    const EXIT_CODE saved = combinations.size() == before
+                                ? EXIT_CODE::Usage
+                                : SaveDocument(in.doc, o.out.empty() ? o.file : o.out);
+    for (const std::string& line : TakeMessageHistory()) {
+        if (!made)
+            Complain(EXIT_CODE::Usage, line);
+        else if (saved == EXIT_CODE::Done)
+            std::printf("%s\n", line.c_str());
+    }
+    return made ? saved : EXIT_CODE::Usage;
 }

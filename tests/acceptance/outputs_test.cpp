@@ -147,7 +147,7 @@ TEST_F(Outputs, PictureHasTitleAxesLegendAndPoint)
     const std::string svg = Text("p.svg");
     EXPECT_TRUE(svg.starts_with("<?xml"));
     ExpectHolds(std::regex_replace(svg, std::regex("<[^>]*>|\n"), ""),
-                {"PX ATC-40 A", "Spectral displacement Sd (m)", "Spectral acceleration Sa (g)",
+                {"PX ATC-40 A", "Spectral Displacement (m)", "Spectral Acceleration (g)",
                  "Elastic demand", "Reduced demand", "Capacity", "Trial points",
                  "Performance point", "Sd = 0.07752 m", "T_eff = 1.00", "T0 = 0.628 s",
                  "Outcome: converged"});

@@ -54,8 +54,8 @@ T_PLOT ComparisonPlot(const T_PUSH_COMPARISON& c)
     const std::string unit(NameOf(first.units.length));
     plot.title = MMSGFunction::Format("IDS_QM_UI_PLOT_ALL_METHODS", {first.eval.push});
     plot.subtitle = MMSGFunction::Format("IDS_QM_UI_PLOT_ALL_SUBTITLE", {first.eval.spectrum});
-    plot.x.title = MMSGFunction::GetValue("IDS_QM_UI_PLOT_SD") + " (" + unit + ")";
-    plot.y.title = MMSGFunction::GetValue("IDS_QM_UI_PLOT_SA") + " (g)";
+    plot.x.title = MMSGFunction::GetValue("IDS_PUSHOVER_Spectral_Displ_") + " (" + unit + ")";
+    plot.y.title = MMSGFunction::GetValue("IDS_PUSHOVER_Spectral_Accel__g_");
     AddAdrsCurve(plot, MMSGFunction::GetValue("IDS_QM_UI_PLOT_DEMAND").c_str(), first.demand,
                  PLOT_LINE::Solid, 1.6, {20, 64, 140});
     AddAdrsCurve(plot, MMSGFunction::GetValue("IDS_QM_UI_PLOT_CAPACITY").c_str(), first.capacity,

@@ -243,8 +243,8 @@ T_PLOT DemandPlot(const T_PUSH_EVALUATION& e)
     plot.title = e.eval.spectrum;
     plot.x.title = byPeriod
                        ? "T (s)"
-                       : MMSGFunction::GetValue("IDS_QM_UI_PLOT_SD") + " (" + LengthUnit(e) + ")";
-    plot.y.title = MMSGFunction::GetValue("IDS_QM_UI_PLOT_SA") + " (g)";
+                       : MMSGFunction::GetValue("IDS_PUSHOVER_Spectral_Displ_") + " (" + LengthUnit(e) + ")";
+    plot.y.title = MMSGFunction::GetValue("IDS_PUSHOVER_Spectral_Accel__g_");
     AddDemands(plot, shown);
     AddAdrsCurve(plot, MMSGFunction::GetValue("IDS_QM_UI_PLOT_REDUCED").c_str(), take(e.reduced),
                  PLOT_LINE::Dash, 1.8, kRed);
@@ -270,9 +270,11 @@ T_PLOT EvaluationPlot(const T_PUSH_EVALUATION& e)
 {
     T_PLOT plot;
     plot.title = e.eval.name;
-    plot.subtitle = PlotSubtitle(e);
-    plot.x.title = MMSGFunction::GetValue("IDS_QM_UI_PLOT_SD") + " (" + LengthUnit(e) + ")";
-    plot.y.title = MMSGFunction::GetValue("IDS_QM_UI_PLOT_SA") + " (g)";
+    plot.subtitle =
+        MMSGFunction::GetValue("IDS_PUSHOVER_Capacity_Spectrum_vs_Demand_Spectrum") + ", " +
+        PlotSubtitle(e);
+    plot.x.title = MMSGFunction::GetValue("IDS_PUSHOVER_Spectral_Displ_") + " (" + LengthUnit(e) + ")";
+    plot.y.title = MMSGFunction::GetValue("IDS_PUSHOVER_Spectral_Accel__g_");
     AddDemands(plot, e);
     AddAdrsCurve(plot, MMSGFunction::GetValue("IDS_QM_UI_PLOT_WORKING").c_str(), e.working,
                  PLOT_LINE::DashDot, 1.4, kGray);

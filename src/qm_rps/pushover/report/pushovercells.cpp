@@ -16,6 +16,11 @@ std::string Number(const std::optional<double>& v)
 {
     return v ? FormatText("%.6g", *v) : "-";
 }
+/// A displacement of a limit state.
+std::string State(const std::optional<double>& v)
+{
+    return v ? FormatText("%6.4g", *v) : "-";
+}
 std::string Step(const std::optional<int>& v)
 {
     return v ? std::to_string(*v) : "-";
@@ -145,7 +150,7 @@ T_TEXT_TABLE PushoverStateCells(const T_PUSH_EVALUATION& e)
         if (e.elastic)
             t.rows.push_back({r.name, "-", "-", kElasticText, "-", r.RemarkText()});
         else
-            t.rows.push_back({r.name, Number(r.demand), Step(r.demandStep), Number(r.capacity),
+            t.rows.push_back({r.name, State(r.demand), Step(r.demandStep), State(r.capacity),
                               Step(r.capacityStep), r.RemarkText()});
     }
     return t;
