@@ -211,6 +211,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     WriteAll(path, isFile ? TextOf(data, size) : std::string_view(BaseFile()));
     try {
         const CSqliteDb db = CSqliteDb::OpenForWriting(path);
+        db.Exec("PRAGMA cache_size = -4000; BEGIN");
         CBytes in(data, isFile ? 0 : size);
         while (!in.IsEmpty()) {
             try {
@@ -219,6 +220,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
             }
         }
         WriteChecksums(db);
+        db.Exec("COMMIT");
     } catch (const std::exception&) { // a file that can't even be summed
     }
     T_MODEL_CONTENT content;

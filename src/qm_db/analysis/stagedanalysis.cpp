@@ -92,32 +92,6 @@ std::vector<int> StageLoadCases(const T_MODEL& model)
     return {keys.begin(), keys.end()};
 }
 
-std::set<int> StandingElements(const T_MODEL& model, int stage)
-{
-    std::set<int> standing;
-    for (const auto& [key, record] : model.stages) {
-        if (key > stage) break;
-        for (const int id : record.deactivate.elements)
-            standing.erase(id);
-        standing.insert(record.activate.elements.begin(), record.activate.elements.end());
-    }
-    return standing;
-}
-
-bool BelongsTo(int load, int loadCase, int group)
-{
-    switch (load) {
-    case kStageLoadSum:
-        return true;
-    case kStageLoadDead:
-        return group == kLoadGroupDead;
-    case kStageLoadErection:
-        return group == kLoadGroupErection;
-    default:
-        return load == loadCase;
-    }
-}
-
 CStagedAnalysis::CStagedAnalysis(const T_MODEL& model)
     : m_model(model), m_frame(model), m_cases(StageLoadCases(model))
 {

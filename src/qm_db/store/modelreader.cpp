@@ -217,8 +217,8 @@ T_MODEL_CONTENT ReadModelFile(const std::string& path, const T_SCHEMA& schema, C
 
 std::uint64_t StampOfModelFile(const std::string& path)
 {
-    (void)CheckHeader(path, CurrentSchema());
-    return SumOfRows(CSqliteDb::OpenReadOnly(path),
+    const auto header = CheckHeader(path, CurrentSchema());
+    return SumOfRows(CSqliteDb::OpenReadOnly(path, header.fileSize),
                      std::string("SELECT name, value FROM ") + kSumTable + " ORDER BY name");
 }
 

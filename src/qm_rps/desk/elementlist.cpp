@@ -5,8 +5,7 @@
 
 namespace {
 
-constexpr int kLargestRange = 1000000;
-constexpr std::size_t kLargestList = 10000000; // of all ranges together
+constexpr std::size_t kMost = 1000000; // numbers, each time that one is named
 
 /// "7" or "5-9" into the list. False: neither.
 bool AddPart(std::string_view part, std::vector<int>& ids)
@@ -21,7 +20,7 @@ bool AddPart(std::string_view part, std::vector<int>& ids)
         read = std::from_chars(read.ptr + 1, end, to);
         if (read.ec != std::errc() || read.ptr != end) return false;
     }
-    if (to < from || to - from >= kLargestRange || ids.size() >= kLargestList) return false;
+    if (to < from || ids.size() + static_cast<std::size_t>(to - from) >= kMost) return false;
     for (int i = 0; i <= to - from; ++i) // to may be the largest number
         ids.push_back(from + i);
     return true;

@@ -6,8 +6,7 @@
 #include <vector>
 
 /// The numbers of "1, 2, 5-9", ascending, each once; an empty text is an empty list. None: the text
-/// is no such list, a range has more than a million numbers, or all have more than
-/// ten million.
+/// is no such list, or names more than a million numbers.
 std::optional<std::vector<int>> ParseElementList(const std::string& text);
 
 /// The shortest such text of numbers that ascend: "1, 2, 5-9".
