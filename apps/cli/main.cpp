@@ -68,7 +68,7 @@ int RunCommand(int argc, char** argv)
                                          : ParserWords(e.what());
         const std::string meant =
             MeantWord(app, std::span<const char* const>(argv + 1, argv + argc));
-        const std::string words = meant.empty() ? what : Say("IDS_QM_CLI_MEANT", what, meant);
+        const std::string words = meant.empty() ? what : what + "; " + meant;
         return ToInt(Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_SEE_HELP", words)));
     }
     if (!CConsole::Flush()) {

@@ -92,6 +92,11 @@ std::string NearOption(const CLI::App& app, std::string_view word)
     return NearestName(word.substr(0, word.find('=')), views);
 }
 
+std::string Meant(std::string_view word, const std::string& near)
+{
+    return near.empty() ? near : Say("IDS_QM_CLI_MEANT", near, std::string(word));
+}
+
 } // namespace
 
 std::string MeantWord(const CLI::App& program, std::span<const char* const> words)
@@ -101,7 +106,7 @@ std::string MeantWord(const CLI::App& program, std::span<const char* const> word
         const std::string_view word = words[i];
         if (word.starts_with("-")) {
             const CLI::Option* option = OptionOf(*app, word);
-            if (!option) return word.starts_with("--") ? NearOption(*app, word) : std::string();
+            if (!option) return word.starts_with("--") ? Meant(word, NearOption(*app, word)) : "";
             const bool takesNext = option->get_expected_min() > 0 && word.find('=') == word.npos;
             if (takesNext) i += static_cast<std::size_t>(option->get_expected_min());
             continue;
@@ -109,7 +114,7 @@ std::string MeantWord(const CLI::App& program, std::span<const char* const> word
         const auto commands = CommandsOf(*app);
         if (commands.empty()) continue; // a file
         const auto at = std::ranges::find(commands, word, &CLI::App::get_name);
-        if (at == commands.end()) return NearCommand(*app, word);
+        if (at == commands.end()) return Meant(word, NearCommand(*app, word));
         app = *at;
     }
     return {};

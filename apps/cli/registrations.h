@@ -15,8 +15,8 @@ class App;
 void AddHelp(CLI::App& app);
 /// What the argument parser refuses, in the language of the user.
 std::string ParserWords(const std::string& what);
-/// The command or option that the first unknown word of the command line was meant to be; empty:
-/// all are known, or none is near.
+/// Asks for the command or option that the first unknown word of the command line was meant to be;
+/// empty: all are known, or none is near.
 std::string MeantWord(const CLI::App& program, std::span<const char* const> words);
 void AddModel(CLI::App& app, EXIT_CODE& code);
 void AddEvaluations(CLI::App& app, EXIT_CODE& code);
