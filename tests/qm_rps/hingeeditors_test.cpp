@@ -209,15 +209,6 @@ TEST(HingeEditors, AutomaticPagesShowWhatTheTypesOwnSectionGives)
     EXPECT_DOUBLE_EQ(300.0, fema(deform));
     EXPECT_DOUBLE_EQ(3.0, deform);
 
-    CPO_HingeSkcvTabDlg multi;
-    multi.m_owner = owner;
-    multi.m_owner.type.components[4].type = SKEL_TYPE::Trilinear;
-    ASSERT_TRUE(
-        multi.Data2Dlg(HINGE_COMPONENT::My, ComponentWith(SKEL_TYPE::Trilinear, T_SKEL_MULTI())));
-    multi.OnEdited();
-    EXPECT_DOUBLE_EQ(300.0, multi.Curve(HINGE_END::Both)->sides.pos.P2);
-    EXPECT_EQ(0.0, multi.Curve(HINGE_END::Both)->sides.pos.P1); // is entered
-
     T_YIELD_SURFACE surface;
     surface.yield.z.used = false;
     CPO_HingeYieldPropDlgNew dlg(surface, SKEL_TYPE::Fema);

@@ -261,34 +261,29 @@ TEST(HingeTypeWarnings, RatiosMustSuitSeveralCurvesAtOnce)
 
 TEST(HingeTypeWarnings, PointsLieWhereTheMeasureHasThem)
 {
-    const struct {
-        const char* rule; // of the only warning; "": none
-        void (*spoil)(T_SKEL_FEMA&);
-    } kCases[] = {
-        {"", [](T_SKEL_FEMA&) {}},
-        {"D(B) = 1", [](T_SKEL_FEMA& f) { f.sides.pos.B.deform = 1.1; }},
-        {"D(B) = 1", [](T_SKEL_FEMA& f) { f.sides.neg.B.deform = -0.9; }},
-        {"D(B) = 0",
-         [](T_SKEL_FEMA& f) { f.measure = SKEL_MEASURE::Plastic, f.sides.neg.B.deform = 0; }},
-        {"F(B) = 1", [](T_SKEL_FEMA& f) { f.sides.neg.B.strength = -1.1; }},
-        {"", [](T_SKEL_FEMA& f) { f.sides.pos.CP = 8; }},
-        {"CP <= D(E)", [](T_SKEL_FEMA& f) { f.sides.pos.CP = 8.001; }},
-        {"", [](T_SKEL_FEMA& f) { f.sides.pos.CP = 9, f.compliance = false; }},
-        {"P = 500",
-         [](T_SKEL_FEMA& f) {
-             f.multiCurve = true, f.curves = {{500, f.sides}, {900, f.sides}};
-         }},
-        {"",
-         [](T_SKEL_FEMA& f) {
-             f.multiCurve = true, f.curves = {{0, f.sides}, {9, f.sides}};
-         }},
+    using F = T_SKEL_FEMA;
+    const auto at = [](F& f, double force) {
+        f.multiCurve = true, f.curves = {{force, f.sides}, {900, f.sides}};
     };
-    for (const auto& c : kCases) {
-        SCOPED_TRACE(&c - kCases);
+    // clang-format off
+    const std::pair<const char*, std::function<void(F&)>> kCases[] = { // the only warning
+        {"", [](F&) {}},
+        {"D(B) = 1", [](F& f) { f.sides.pos.B.deform = 1.1; }},
+        {"D(B) = 1", [](F& f) { f.sides.neg.B.deform = -0.9; }},
+        {"D(B) = 0", [](F& f) { f.measure = SKEL_MEASURE::Plastic, f.sides.neg.B.deform = 0; }},
+        {"F(B) = 1", [](F& f) { f.sides.neg.B.strength = -1.1; }},
+        {"", [](F& f) { f.sides.pos.CP = 8; }},
+        {"CP <= D(E)", [](F& f) { f.sides.pos.CP = 8.001; }},
+        {"", [](F& f) { f.sides.pos.CP = 9, f.compliance = false; }},
+        {"P = 500", [&](F& f) { at(f, 500); }},
+        {"", [&](F& f) { at(f, 0); }},
+    };
+    // clang-format on
+    for (const auto& [rule, spoil] : kCases) {
         T_PHGT_D t = Type();
-        c.spoil(Fema(t));
+        spoil(Fema(t));
         const auto found = HingeTypeWarnings(t);
-        EXPECT_EQ(*c.rule ? 1u : 0u, found.size());
-        EXPECT_EQ(c.rule, First(found));
+        EXPECT_EQ(*rule ? 1u : 0u, found.size()) << rule;
+        EXPECT_EQ(rule, First(found));
     }
 }

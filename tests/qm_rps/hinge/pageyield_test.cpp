@@ -46,46 +46,40 @@ TEST(PageYield, EnteredCurvesByAxialForceCountWithoutForce)
 // E = 100, I = 2, L = 3: 6EI/L = 400, EI = 200; a span of 12 makes 6EI/L = 100. M = 300.
 TEST(PageYield, DeformationFollowsDefinitionSpanAndSide)
 {
+    using T = T_PHGT_D;
+    using F = T_SKEL_FEMA;
     T_SECT_D section;
     section.area = section.Asy = section.Asz = section.J = section.Izz = 1;
     section.Iyy = 2, section.Zy = section.Zz = 1;
     T_MATL_D material;
     material.E = 100;
+    constexpr auto kUser = INIT_STIFFNESS::User;
+    constexpr auto kLink = HINGE_ELEMENT::GeneralLink; // has no section
     const struct {
         const char* what;
-        void (*edit)(T_PHGT_D&, T_SKEL_FEMA&);
+        void (*edit)(T&, F&);
         double pos, neg;
     } kCases[] = {
-        {"rotation", [](T_PHGT_D&, T_SKEL_FEMA&) {}, 0.75, 0.75},
-        {"own span", [](T_PHGT_D& t, T_SKEL_FEMA&) { t.length.autoSpan = false; }, 3, 3},
-        {"curvature",
-         [](T_PHGT_D& t, T_SKEL_FEMA&) { t.definition = HINGE_DEFINITION::CurvatureLumped; }, 1.5,
-         1.5},
-        {"one user stiffness",
-         [](T_PHGT_D&, T_SKEL_FEMA& f) { f.initStiffness = INIT_STIFFNESS::User; }, 3, 3},
-        {"one of each side",
-         [](T_PHGT_D&, T_SKEL_FEMA& f) {
-             f.initStiffness = INIT_STIFFNESS::User, f.asymStiffness = true;
-         },
-         3, 6},
-        {"a link has no section",
-         [](T_PHGT_D& t, T_SKEL_FEMA& f) {
-             f.initStiffness = INIT_STIFFNESS::User, t.element = HINGE_ELEMENT::GeneralLink;
-         },
-         3, 3},
+        // clang-format off
+        {"rotation", [](T&, F&) {}, 0.75, 0.75},
+        {"own span", [](T& t, F&) { t.length.autoSpan = false; }, 3, 3},
+        {"curvature", [](T& t, F&) { t.definition = HINGE_DEFINITION::CurvatureLumped; }, 1.5, 1.5},
+        {"one stiffness", [](T&, F& f) { f.initStiffness = kUser; }, 3, 3},
+        {"two", [](T&, F& f) { f.initStiffness = kUser, f.asymStiffness = true; }, 3, 6},
+        {"link", [](T& t, F& f) { f.initStiffness = kUser, t.element = kLink; }, 3, 3},
+        // clang-format on
     };
     for (const auto& c : kCases) {
-        SCOPED_TRACE(c.what);
-        T_PHGT_D type;
+        T type;
         type.length.span = 12;
-        T_SKEL_FEMA f; // symmetric
+        F f; // symmetric
         f.sides.pos.userStiffness = 100, f.sides.neg.userStiffness = 50;
         c.edit(type, f);
-        const bool link = type.element == HINGE_ELEMENT::GeneralLink;
+        const bool line = HasLineElement(type);
         const auto lookup =
-            LookupOf(type, link ? nullptr : &section, link ? nullptr : &material, 3);
+            LookupOf(type, line ? &section : nullptr, line ? &material : nullptr, 3);
         const auto d = PageDeform(f, kMy, HINGE_LOCATION::IEnd, lookup, {300.0, 300.0});
-        EXPECT_DOUBLE_EQ(c.pos, d.pos.value_or(0));
-        EXPECT_DOUBLE_EQ(c.neg, d.neg.value_or(0));
+        EXPECT_DOUBLE_EQ(c.pos, d.pos.value_or(0)) << c.what;
+        EXPECT_DOUBLE_EQ(c.neg, d.neg.value_or(0)) << c.what;
     }
 }
