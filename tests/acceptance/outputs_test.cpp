@@ -2,6 +2,7 @@
 #include "program.h"
 #include "qm_base/textformat.h"
 
+#include <cmath>
 #include <regex>
 #include <set>
 #include <sstream>
@@ -66,6 +67,26 @@ TEST_F(Outputs, WhatIsRefusedBesideAResultLeavesTheResults)
     for (const json& r : results)
         EXPECT_EQ(r.at("trials") != 0, r.contains("additional_points")) << r.at("name");
     EXPECT_EQ(2, Run("evaluate @first-steps --only 'PX EC8' --add-spectrum EC8").code);
+}
+
+// Yield at Sd = 0.036 / Gamma and 720 kN / (M* g), then 0.05 of the stiffness: T0 = 0.2 pi and
+// Teff = T0 sqrt(mu / (1 + 0.05 (mu - 1))); the push ends at mu = 5.
+TEST_F(Outputs, SlopeChangeAndPeriodsByDuctilityStandInJsonAndPicture)
+{
+    const json r = Json("evaluate @first-steps --only 'PX ATC-40 B' --plot p.svg "
+                        "--plot-demand d.svg")[0];
+    EXPECT_NEAR(0.028, r.at("first_slope_change").at("Sd"), 1e-12);
+    const json& periods = r.at("periods_by_ductility");
+    ASSERT_EQ(3U, periods.size());
+    const double T0 = 0.2 * std::acos(-1.0);
+    for (const json& p : periods) {
+        const double mu = p.at("mu");
+        EXPECT_NEAR(T0 * std::sqrt(mu / (1.0 + 0.05 * (mu - 1.0))), p.at("T_eff"), 1e-4) << mu;
+    }
+    ExpectHolds(Text("p.svg"), {"first slope change", "Teff(mu=4) = 1.17 s"});
+    ExpectHolds(Text("d.svg"), {"T (s)"});
+    const json& curve = r.at("curve");
+    EXPECT_NEAR(0.14, curve.at("largest_displacement"), 1e-12); // 0.18 m / Gamma
 }
 
 TEST_F(Outputs, CompareListsEveryMethodWithTheSpread)

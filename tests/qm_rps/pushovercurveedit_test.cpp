@@ -209,3 +209,32 @@ TEST(PushoverCells, APointIsPlacedOnTheCurvesOfOtherPlotTypes)
         EXPECT_FALSE(PlaceOnCurve(edit->Shown().Result(), 0.091 / kGamma)) << "beyond the curve";
     }
 }
+
+TEST(PushoverCells, ATargetTellsItsBranchInOneLine)
+{
+    T_TARGET_DISP t;
+    t.Tstar = 0.75;
+    t.Se = 0.3;
+    t.det = t.dt = 0.04;
+    EXPECT_EQ("(Long) det* = dt* = 0.04, Gamma = 1.25, Se(T*) = 0.3, T* = 0.75",
+              TargetLine(t, 1.25));
+    t.qu = 1.5;
+    t.dt = 0.05;
+    EXPECT_EQ("(Short) T* = 0.75, Se(T*) = 0.3 , det* = 0.04, dt* = 0.05, Gamma = 1.25",
+              TargetLine(t, 1.25));
+}
+
+// A push along one line gives no capacity; a kink of 1 % at its end does.
+TEST(PushoverCells, ACurveThatStaysElasticShowsNoCapacity)
+{
+    for (const bool kink : {false, true}) {
+        T_MODEL_CONTENT c = ThreeMasses({0.03, 0.06, 0.09}, {10, 20, kink ? 29.7 : 30});
+        c.model.spectra[1] = Plastic().model.spectra[1];
+        T_EDIT edit(c);
+        edit->m_settings.method = PUSH_METHOD::Ntc2008;
+        edit->OnEdited();
+        EXPECT_EQ(!kink, edit->Shown().Result().elastic);
+        const std::vector<std::string> row = PushoverStateCells(edit->Shown().Result()).rows.at(1);
+        EXPECT_EQ(!kink, row.at(3) == "Elastic" && row.at(1) == "-" && row.at(2) == "-");
+    }
+}
