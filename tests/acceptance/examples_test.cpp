@@ -65,7 +65,7 @@ TEST_F(Examples, RecorderFilesGiveTheSolversOwnCurve)
     for (const T_STEP& s : kSteps) {
         if (name != s.example) {
             name = s.example;
-            Done("import @" + name + " m.qmdb");
+            Done("import @" + name + " m.qmdb --overwrite");
             document = json::parse(Done("export m.qmdb"));
         }
         const json& steps = StepsOf(document, s.push);

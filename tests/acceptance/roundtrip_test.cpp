@@ -26,7 +26,7 @@ TEST_F(RoundTrip, ExportImportExportIsTheSameText)
     const std::vector<std::string> files = AllCases();
     ASSERT_GE(files.size(), 12U);
     for (const std::string& file : files) {
-        Done("import " + file + " m.qmdb");
+        Done("import " + file + " m.qmdb --overwrite");
         const std::string text = Done("export m.qmdb");
         EXPECT_GT(text.size(), 500U) << file;
         EXPECT_EQ(text, Done("export " + file)) << file << ": model against case file";
@@ -39,7 +39,7 @@ TEST_F(RoundTrip, CaseFileAndModelGiveTheSameResultsToTheLastByte)
 {
     for (const std::string name : {"first-steps", "steel-frame-2-storey", "rc-frame-2-storey",
                                    "rc-frame-3-storey", "rc-space-frame-3-storey"}) {
-        Done("import @" + name + " m.qmdb");
+        Done("import @" + name + " m.qmdb --overwrite");
         const T_RUN fromCase = Run("evaluate @" + name + " --json -");
         const T_RUN fromModel = Run("evaluate m.qmdb --json -");
         EXPECT_EQ(fromCase.code, fromModel.code) << name;

@@ -67,7 +67,7 @@ protected:
     /// Iterates the case file in a model file "m.qmdb"; its history.
     json Iterated(const std::string& file, const std::string& item) const
     {
-        Done("import " + file + " m.qmdb");
+        Done("import " + file + " m.qmdb --overwrite");
         const json result =
             Json("ulf iterate m.qmdb --item " + item + " --tolerance 1e-6 --iterations 20");
         EXPECT_EQ("converged", result.at("status"));

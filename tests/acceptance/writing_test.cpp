@@ -109,8 +109,7 @@ TEST_F(Writing, FollowsThePermissionsOfTheModel)
 
 TEST_F(Writing, AnIterationEndsOnASignalWithTheLoadsBefore)
 {
-    // A shell has what it runs in the background ignore SIGINT.
-    for (const char* signal : {"TERM", "HUP"}) {
+    for (const char* signal : {"INT", "TERM", "HUP"}) {
         const T_RUN run =
             RunShell("rm -f * && qm-rps import @cable-stayed-bridge-staged m.qmdb && { qm-rps ulf "
                      "iterate m.qmdb --item STAYS --iterations 99 --tolerance 0 & p=$!; "

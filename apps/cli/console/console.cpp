@@ -77,7 +77,8 @@ CInterrupt::CInterrupt()
     for (std::size_t i = 0; i < kSignals.size(); ++i) {
         sigaction(kSignals[i], nullptr, &g_actions[i]);
         // A program that was started to outlive its terminal (nohup) goes on doing so.
-        if (g_actions[i].sa_handler != SIG_IGN) sigaction(kSignals[i], &action, nullptr);
+        if (kSignals[i] == SIGHUP && g_actions[i].sa_handler == SIG_IGN) continue;
+        sigaction(kSignals[i], &action, nullptr);
     }
 }
 
