@@ -43,13 +43,16 @@ int CUlfIteration::WriteFirst()
     const bool add = std::filesystem::exists(m_report, ignored) && !m_person.MayOverwrite(m_report);
     T_FILE_ERROR error;
     m_reportText.clear();
-    if (add && !CFileCtrl::ReadWholeFile(m_report, m_reportText, error)) return RefuseReport();
+    m_isPipe = add && !std::filesystem::is_regular_file(m_report, ignored);
+    if (add && !m_isPipe && !CFileCtrl::ReadWholeFile(m_report, m_reportText, error))
+        return RefuseReport();
     return AddToReport(text);
 }
 
-/// The report is written as a whole: a full disk leaves the blocks before.
+/// The report is written as a whole: a full disk leaves the blocks before. A pipe keeps nothing.
 int CUlfIteration::AddToReport(const std::string& text)
 {
+    if (m_isPipe) m_reportText.clear();
     m_reportText += text;
     T_FILE_ERROR error;
     return CFileCtrl::WriteWholeFile(m_report, m_reportText, error) ? 1 : RefuseReport();

@@ -66,5 +66,6 @@ private:
     std::string m_model;     // path at the start: copies are numbered from it
     std::string m_report;
     std::string m_reportText; // as in the file
+    bool m_isPipe = false;    // the report; it gets each block once
     ULF_ITER_END m_end = ULF_ITER_END::Declined;
 };
