@@ -241,9 +241,9 @@ T_PLOT DemandPlot(const T_PUSH_EVALUATION& e)
         shown.stateDemands.push_back(take(c));
     T_PLOT plot;
     plot.title = e.eval.spectrum;
-    plot.x.title = byPeriod
-                       ? "T (s)"
-                       : MMSGFunction::GetValue("IDS_PUSHOVER_Spectral_Displ_") + " (" + LengthUnit(e) + ")";
+    plot.x.title = byPeriod ? "T (s)"
+                            : MMSGFunction::GetValue("IDS_PUSHOVER_Spectral_Displ_") + " (" +
+                                  LengthUnit(e) + ")";
     plot.y.title = MMSGFunction::GetValue("IDS_PUSHOVER_Spectral_Accel__g_");
     AddDemands(plot, shown);
     AddAdrsCurve(plot, MMSGFunction::GetValue("IDS_QM_UI_PLOT_REDUCED").c_str(), take(e.reduced),
@@ -270,10 +270,10 @@ T_PLOT EvaluationPlot(const T_PUSH_EVALUATION& e)
 {
     T_PLOT plot;
     plot.title = e.eval.name;
-    plot.subtitle =
-        MMSGFunction::GetValue("IDS_PUSHOVER_Capacity_Spectrum_vs_Demand_Spectrum") + ", " +
-        PlotSubtitle(e);
-    plot.x.title = MMSGFunction::GetValue("IDS_PUSHOVER_Spectral_Displ_") + " (" + LengthUnit(e) + ")";
+    plot.subtitle = MMSGFunction::GetValue("IDS_PUSHOVER_Capacity_Spectrum_vs_Demand_Spectrum") +
+                    ", " + PlotSubtitle(e);
+    plot.x.title =
+        MMSGFunction::GetValue("IDS_PUSHOVER_Spectral_Displ_") + " (" + LengthUnit(e) + ")";
     plot.y.title = MMSGFunction::GetValue("IDS_PUSHOVER_Spectral_Accel__g_");
     AddDemands(plot, e);
     AddAdrsCurve(plot, MMSGFunction::GetValue("IDS_QM_UI_PLOT_WORKING").c_str(), e.working,
