@@ -62,8 +62,8 @@ TEST_F(BadCase, EachIsRefusedWithOneLineAndNothingIsWritten)
     for (const T_BAD_CASE& c : kBadCases) {
         SCOPED_TRACE(std::string(c.from) + " -> " + c.to);
         Write("bad.json", With(kSmallCase, c.from, c.to));
-        for (const char* line :
-             {"evaluate bad.json --json o.json --report o.txt", "import bad.json m.qmdb"}) {
+        for (const char* line : {"evaluate bad.json --json o.json --report o.txt",
+                                 "import bad.json m.qmdb --overwrite"}) {
             ExpectHolds(ExpectRefused(line, 3, c.place), {"bad.json"});
             EXPECT_EQ(before, Text("m.qmdb"));
             EXPECT_EQ(kInput, m_folder.Names());

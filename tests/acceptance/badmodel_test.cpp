@@ -72,11 +72,11 @@ TEST_F(BadModel, AFileThatIsOpenElsewhereIsNotReplaced)
     ASSERT_GE(held, 0);
     ASSERT_EQ(0, flock(held, LOCK_EX | LOCK_NB));
     Write("case.json", With(kSmallCase, "small frame", "another frame"));
-    ExpectRefused("import case.json m.qmdb", 4, "open");
+    ExpectRefused("import case.json m.qmdb --overwrite", 4, "open");
     EXPECT_EQ(m_good, Text("m.qmdb"));
     Done("evaluate m.qmdb --no-store"); // reading is free
     close(held);
-    Done("import case.json m.qmdb");
+    Done("import case.json m.qmdb --overwrite");
 }
 
 TEST_F(BadModel, AReadOnlyFileInAReadOnlyFolderIsEvaluated)
