@@ -188,19 +188,21 @@ TEST(AnalysisJob, WhatTheJobThrowsBecomesAnError)
 {
     struct T_ROW {
         CAnalysisWorker::JobFn job;
+        ANALYSIS_FAULT fault;
         const char* text;
     };
     const T_ROW rows[] = {
-        {[](const auto&, auto&, auto&) -> int { throw std::bad_alloc(); },
+        {[](const auto&, auto&, auto&) -> int { throw std::bad_alloc(); }, ANALYSIS_FAULT::NoMemory,
          "the analysis failed: not enough memory"},
-        {[](const auto&, auto&, auto&) -> int { throw 3; }, "the analysis failed: unknown reason"},
+        {[](const auto&, auto&, auto&) -> int { throw 3; }, ANALYSIS_FAULT::Failed,
+         "the analysis failed: unknown reason"},
     };
     for (const T_ROW& row : rows) {
         CAnalysisWorker worker(row.job);
         T_ANALYSIS_RESULTS results;
         T_ANALYSIS_ERROR error;
         EXPECT_EQ(0, worker.Finish(results, error));
-        EXPECT_EQ(ANALYSIS_FAULT::Failed, error.fault);
+        EXPECT_EQ(row.fault, error.fault);
         EXPECT_EQ(row.text, error.text);
     }
 }
