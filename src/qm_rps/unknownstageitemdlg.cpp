@@ -193,8 +193,10 @@ std::array<CUnknownStageItemDlg::T_SUMMARY, 3> CUnknownStageItemDlg::Summary() c
         s.unknowns += row.unknown ? 1 : 0;
     };
     for (const T_ULSI_ROW& row : m_rows) {
-        if (row.loadGroup == kLoadGroupDead) count(summary[0], row);
-        if (row.loadGroup == kLoadGroupErection) count(summary[1], row);
+        T_STLD_D load;
+        const bool isThere = m_doc.Attr().GetStld(row.loadCase, load) != 0;
+        if (isThere && load.group == kLoadGroupDead) count(summary[0], row);
+        if (isThere && load.group == kLoadGroupErection) count(summary[1], row);
         count(summary[2], row);
     }
     return summary;

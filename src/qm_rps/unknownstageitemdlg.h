@@ -13,7 +13,8 @@ public:
         "IDS_RPS_GXGRID_Stage",        "IDS_RPS_GXGRID_LCase",  "IDS_RPS_GXGRID_Unknown",
         "IDS_RPS_GXGRID_known",        "IDS_RPS_GXGRID_Factor", "IDS_RPS_GXGRID_Weighted_Factor",
         "IDS_QM_ULSI_HEAD_PRETENSION", "IDS_QM_ULSI_HEAD_GROUP"};
-    /// A row below the grid: how many loads read the dead load, the erection load, and in all.
+    /// A row below the grid: how many rows are of dead load cases, of erection load cases, and in
+    /// all.
     struct T_SUMMARY {
         std::string_view key; // of its text
         std::size_t rows = 0, unknowns = 0;
@@ -47,7 +48,7 @@ public:
     /// 0: no such row.
     [[nodiscard]] int OnDeleteRow(std::size_t row);
 
-    /// Rows of load group 0, of group 1, and all of them.
+    /// By the groups of the rows' load cases, whatever the rows read.
     std::array<T_SUMMARY, 3> Summary() const;
 
     /// Rules that are not kept; of a row each is told with its number, stage/step and load case.

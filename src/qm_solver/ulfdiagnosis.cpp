@@ -56,7 +56,7 @@ std::optional<double> PriceAt(const T_ULF_PROBLEM& problem, std::size_t i, doubl
     const T_ULF_ANSWER answer = SolveUlf(moved);
     if (answer.code != ULF_SOLVED && answer.code != ULF_RELAXED) return std::nullopt;
     const auto price = static_cast<double>(answer.prices[i]);
-    constexpr double kSame = 1e-3; // of the square sum the price itself moves with the limit
+    constexpr double kSame = 5e-3; // of the square sum the price itself moves with the limit
     return std::fabs(price - before) <= kSame * std::fabs(before) ? before : price;
 }
 
@@ -64,7 +64,7 @@ std::optional<double> PriceAt(const T_ULF_PROBLEM& problem, std::size_t i, doubl
 void PriceSides(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& s, std::span<const double> x,
                 T_ULF_HELD& held)
 {
-    constexpr long double kStep = 1e-8L; // of the row's unit: beyond kActiveTol
+    constexpr long double kStep = 1e-7L; // of the row's unit: beyond kUlfRelaxedTol
     const auto i = static_cast<std::size_t>(held.index);
     const auto step = static_cast<double>(kStep * RowUnit(s, i, x));
     held.raised = PriceAt(problem, i, problem.rhs[i] + step, held.multiplier);

@@ -59,7 +59,7 @@ class CUlfDiagnosis {
 public:
     /// Solves, and gives the multipliers (Karush, Kuhn and Tucker) of the answer. Where several
     /// sets of multipliers are right (repeated rows) it is one of them; to each side there is one,
-    /// found with the limit moved by 1e-8 in the scale of ulfproblem.h. 1 done; 0 the problem can't
+    /// found with the limit moved by 1e-7 in the scale of ulfproblem.h. 1 done; 0 the problem can't
     /// be used or has no certified answer, `out` as it was.
     [[nodiscard]] int Explain(const T_ULF_PROBLEM& problem, T_ULF_EXPLANATION& out) const;
     /// Singular values of the matrix. 1 done; 0 the problem can't be used, `out` as it was.

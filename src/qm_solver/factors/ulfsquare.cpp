@@ -3,24 +3,6 @@
 #include <algorithm>
 #include <cmath>
 
-void AcceptUlf(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& scaled,
-               std::span<const long double> y, std::vector<long double> multipliers,
-               T_ULF_ANSWER& answer)
-{
-    std::vector<double> x = UnscaleUlf(scaled, y);
-    answer.code = ULF_NOT_CERTIFIED;
-    answer.x.clear();
-    answer.certificate = CertifyUlf(problem, scaled, x, multipliers);
-    if (!answer.certificate.Holds(kUlfRelaxedTol)) return;
-    answer.code = answer.certificate.Holds(kUlfFeasibleTol) ? ULF_SOLVED : ULF_RELAXED;
-    answer.x = std::move(x);
-    const long double unit = problem.objective == 2 ? 2.0L * scaled.rhsScale : 1.0L;
-    answer.prices.clear();
-    for (std::size_t i = 0; i < scaled.nCon; ++i)
-        answer.prices.push_back(-multipliers[i] * unit / scaled.rowNorm[i]);
-    answer.multipliers = std::move(multipliers);
-}
-
 namespace {
 
 // Share of the columns' own metric, squared, against the weights': from steps that go far, where
@@ -123,6 +105,24 @@ void Approach(const T_ULF_PROBLEM& problem, double share, ULF_PRECISION precisio
 }
 
 } // namespace
+
+void AcceptUlf(const T_ULF_PROBLEM& problem, const T_ULF_SCALED& scaled,
+               std::span<const long double> y, std::vector<long double> multipliers,
+               T_ULF_ANSWER& answer)
+{
+    std::vector<double> x = UnscaleUlf(scaled, y);
+    answer.code = ULF_NOT_CERTIFIED;
+    answer.x.clear();
+    answer.certificate = CertifyUlf(problem, scaled, x, multipliers);
+    if (!answer.certificate.Holds(kUlfRelaxedTol)) return;
+    answer.code = answer.certificate.Holds(kUlfFeasibleTol) ? ULF_SOLVED : ULF_RELAXED;
+    answer.x = std::move(x);
+    const long double unit = problem.objective == 2 ? 2.0L * scaled.rhsScale : 1.0L;
+    answer.prices.clear();
+    for (std::size_t i = 0; i < scaled.nCon; ++i)
+        answer.prices.push_back(-multipliers[i] * unit / scaled.rowNorm[i]);
+    answer.multipliers = std::move(multipliers);
+}
 
 void AddUlfSigns(const T_ULF_SCALED& scaled, T_ULF_ROWS& rows)
 {

@@ -126,7 +126,7 @@ TEST(UlfChecks, StaticItemsAreJudgedRuleByRule)
         {"IDS_QM_ULFI_NO_SUCH_CONSTRAINT", "constraints",
          [](M&, I& i) { i.constraints[0] = "gone"; }},
         {"IDS_QM_ULFI_TWICE", "constraints", [](M&, I& i) { i.constraints.push_back("D2"); }},
-        {"IDS_QM_ULFI_STAGE_CONSTRAINT", "constraints",
+        {"IDS_QM_ULFI_STAGE_CONSTRAINT", "constraints[D2].stage",
          [](M& m, I&) { m.ulfConstraints[1].stage = 1; }},
         {"IDS_RPS_the_Node_Id_doesn_t_exist", "constraints[D3].id",
          [](M& m, I&) { m.nodes.erase(3); }},

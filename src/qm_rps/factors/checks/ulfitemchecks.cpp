@@ -151,14 +151,6 @@ bool UnknownsDiffer(const T_ITEM_CHECK& c)
 {
     return AllDiffer(c.item.unknowns, &T_ULFI_UNKNOWN::loadCase);
 }
-/// The constraints that are there have no stage.
-bool ConstraintsAreStatic(const T_ITEM_CHECK& c)
-{
-    return std::ranges::none_of(c.item.constraints, [&](const std::string& name) {
-        const int key = FindUlfConstraint(c.model, name);
-        return key != 0 && c.model.ulfConstraints.at(key).stage != 0;
-    });
-}
 bool WeightsAreNumbers(const T_ITEM_CHECK& c)
 {
     return std::ranges::all_of(c.item.unknowns, [](const T_ULFI_UNKNOWN& unknown) {
@@ -178,8 +170,9 @@ constexpr T_RULE<T_ITEM_CHECK> kUnknownRules[] = {
     {Wrong("IDS_QM_ULFI_TWICE",  "unknowns"), UnknownsDiffer},
     {Wrong("IDS_QM_ULFI_WEIGHT", "unknowns"), WeightsAreNumbers},
 };
-constexpr T_RULE<T_ITEM_CHECK> kStaticPlaceRules[] = {
-    {Wrong("IDS_QM_ULFI_STAGE_CONSTRAINT", "constraints"), ConstraintsAreStatic},
+constexpr T_RULE<T_ULFC_D> kStaticPlaceRules[] = {
+    {Wrong("IDS_QM_ULFI_STAGE_CONSTRAINT", "stage"),
+     [](const T_ULFC_D& c) { return c.stage == 0; }},
 };
 // clang-format on
 
@@ -313,7 +306,14 @@ std::vector<T_FINDING> CheckUlfItem(const T_ULFI_D& item, int ownKey, const CDat
     WalkRules(kWayRules, common, place, out);
     WalkRules(kUnknownRules, own, place, out);
     WalkRules(kConstraintRules, common, place, out);
-    WalkRules(kStaticPlaceRules, own, place, out);
+    for (const std::string& name : item.constraints) {
+        const int key = FindUlfConstraint(model, name);
+        if (key == 0) continue;
+        std::vector<T_FINDING> found;
+        WalkRules(kStaticPlaceRules, model.ulfConstraints.at(key),
+                  {.prefix = "constraints[" + name + "]."}, found);
+        AppendNamed(item.name, name, std::move(found), out);
+    }
     AddConstraintFindings(item.constraints, model, out);
     return out;
 }

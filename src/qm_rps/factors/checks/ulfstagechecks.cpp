@@ -130,14 +130,20 @@ std::vector<T_FINDING> CheckUlfConstraintPlaces(const T_ULSI_D& item, const T_MO
         if (check.place) check.standing = StandingAt(model, check.place->first);
         std::vector<T_FINDING> found;
         WalkRules(kPlaceRules, check, {.prefix = "constraints[" + name + "]."}, found);
-        for (T_FINDING& f : found) {
-            Name(f, item.name,
-                 MMSGFunction::Format("IDS_QM_ULSI_CONSTRAINT",
-                                      {name, MMSGFunction::GetValue(f.ruleText)}));
-            out.push_back(std::move(f));
-        }
+        AppendNamed(item.name, name, std::move(found), out);
     }
     return out;
+}
+
+void AppendNamed(const std::string& item, const std::string& constraint,
+                 std::vector<T_FINDING> found, std::vector<T_FINDING>& out)
+{
+    for (T_FINDING& f : found) {
+        Name(f, item,
+             MMSGFunction::Format("IDS_QM_ULSI_CONSTRAINT",
+                                  {constraint, MMSGFunction::GetValue(f.ruleText)}));
+        out.push_back(std::move(f));
+    }
 }
 
 std::size_t RowThatCounts(const T_ULSI_D& item, std::size_t at, const T_MODEL& model)

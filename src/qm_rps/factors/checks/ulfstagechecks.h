@@ -11,6 +11,10 @@
 /// "constraints[NAME].stage" or ".id".
 std::vector<T_FINDING> CheckUlfConstraintPlaces(const T_ULSI_D& item, const T_MODEL& model);
 
+/// Appends what was found about a constraint, with its name in front of the rule.
+void AppendNamed(const std::string& item, const std::string& constraint,
+                 std::vector<T_FINDING> found, std::vector<T_FINDING>& out);
+
 /// Number from 1 of another row whose results contain those of this row, so that they would count
 /// twice; 0: none. An unknown that an iteration does not scale may add to what a sum contains: its
 /// factor is an increment.
