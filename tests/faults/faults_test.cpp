@@ -224,7 +224,7 @@ TEST(Faults, AnIterationLeavesWholeFilesAndTheModel)
             reason = error.text + analysis.text;
             return 0;
         }
-        CUlfIterationDocHost host(doc, doc.Data().Model().ulfStageItems.begin()->second, false);
+        CUlfIterationDocHost host(doc, doc.Data().Model().ulfStageItems.begin()->second);
         CPerson person;
         CUlfIteration run(host, person, {2, 1e-9});
         const int done = run.Run() && run.End() == ULF_ITER_END::Converged;

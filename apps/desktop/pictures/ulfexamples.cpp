@@ -103,7 +103,7 @@ WINDOW StepWindow(CMainWindow& main)
 {
     T_ULF_ITER_STEP step{0, main.Doc().Path(), {}, 0.0};
     CUnknownStageItemDlg item(main.Doc(), 1);
-    CUlfIterationDocHost host(main.Doc(), item.Record(), false);
+    CUlfIterationDocHost host(main.Doc(), item.Record());
     std::string error;
     std::optional<T_FINDING> said;
     if (!item.OnAnalyse({}, error) || !host.Solve(step.rows, said)) return nullptr;
