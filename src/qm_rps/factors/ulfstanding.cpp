@@ -1,5 +1,6 @@
 #include "qm_rps/factors/ulfstanding.h"
 
+#include "qm_db/datactrl.h"
 #include "qm_rps/factors/ulfstageplace.h"
 
 #include <algorithm>
@@ -21,10 +22,9 @@ void Take(const std::vector<int>& what, std::set<int>& from)
 T_STANDING StandingAt(const T_MODEL& model, int stage)
 {
     T_STANDING s;
+    s.elements = StandingElements(model, stage);
     for (auto it = model.stages.begin(); it != model.stages.upper_bound(stage); ++it) {
-        Take(it->second.deactivate.elements, s.elements); // what goes leaves first
-        Take(it->second.deactivate.supports, s.supports);
-        Bring(it->second.activate.elements, s.elements);
+        Take(it->second.deactivate.supports, s.supports); // what goes leaves first
         Bring(it->second.activate.supports, s.supports);
     }
     for (const int id : s.elements)
