@@ -15,10 +15,11 @@ if(QM_SANITIZE)
   target_link_options(qm_flags INTERFACE -fsanitize=${QM_SANITIZE})
 endif()
 
-# Optimised programs are hardened: what is read may have been made by anybody.
+# Optimised programs are hardened: what is read may have been made by anybody. Position independent as
+# -fPIC, not -fPIE: data of the Qt libraries must not be copied into the program.
 set(hardened $<AND:$<CONFIG:Release>,$<BOOL:${UNIX}>,$<NOT:$<BOOL:${QM_SANITIZE}>>>)
 target_compile_options(qm_flags INTERFACE
-  $<${hardened}:-fPIE> $<${hardened}:-fstack-protector-strong>
+  $<${hardened}:-fPIC> $<${hardened}:-fstack-protector-strong>
   $<${hardened}:-U_FORTIFY_SOURCE> $<${hardened}:-D_FORTIFY_SOURCE=2>)
 target_link_options(qm_flags INTERFACE
   $<${hardened}:-pie> $<${hardened}:LINKER:-z,relro> $<${hardened}:LINKER:-z,now>)

@@ -200,7 +200,7 @@ TEST_F(Ulf, TheSheetIsOpenedOnRequestOrItIsSaidThatItCanNot)
     for (const int code : {0, 3}) { // of the desktop's program
         Write("bin/xdg-open",
               "#!/bin/sh\necho \"$1\" > opened\nexit " + std::to_string(code) + "\n");
-        const T_RUN run = Run("ulf export @tuned-beam --item PROPS -o s.xlsx --open",
+        const T_RUN run = Run("ulf export @tuned-beam --item PROPS -o s.xlsx --overwrite --open",
                               "chmod +x bin/xdg-open; export PATH=\"$PWD/bin:$PATH\"; ");
         EXPECT_EQ(code == 0 ? 0 : 4, run.code) << run.err;
         EXPECT_EQ("s.xlsx\n", Text("opened"));

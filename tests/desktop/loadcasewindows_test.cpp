@@ -10,7 +10,7 @@
 #include "qm_ui/plot/plotwidget.h"
 
 #include <QApplication>
-#include <QTest>
+#include <QKeyEvent>
 #include <QTimer>
 
 using namespace desktop_test;
@@ -91,7 +91,8 @@ TEST_F(LoadCaseWindows, BrokenRulesAreMarkedAndRefusedAndCancelChangesNothing)
     for (const auto answer : {QMessageBox::No, QMessageBox::Yes}) {
         EXPECT_TRUE(window.isVisible());
         CAnswers answers({CAnswers::Press(answer)});
-        QTest::keyClick(&window, Qt::Key_Escape);
+        QKeyEvent escape(QEvent::KeyPress, Qt::Key_Escape, Qt::NoModifier);
+        QApplication::sendEvent(&window, &escape);
         EXPECT_TRUE(answers.m_texts.value(0).contains("what was changed"));
     }
     Settle();

@@ -122,8 +122,10 @@ TEST(HingeCase, RefusesToStoreWhatCouldNotBeRead)
 TEST(HingeCase, ATextWithOlderKeysHoldsTheSameModel)
 {
     T_MODEL_CONTENT now = ParseGood(RichText());
+    now.model.styp.defaultAlpha1 = now.model.styp.defaultAlpha2 = {};
     for (auto& [key, type] : now.model.hingeTypes) {
         type.fibreSection = type.thicknessSection = 0;
+        if (type.pmm) type.pmm->negative.reset(), type.pmm->balanced = false;
         for (T_HINGE_COMPONENT& c : type.components)
             for (T_SKEL_CURVE* curve : {&c.curves.I, &c.curves.J})
                 if (auto* fema = std::get_if<T_SKEL_FEMA>(curve)) fema->compliance = true;

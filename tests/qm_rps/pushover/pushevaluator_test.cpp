@@ -1,4 +1,4 @@
-#include "qm_rps/pushover/pushevaluator.h"
+#include "qm_rps/pushover/evaluation/pushevaluator.h"
 
 #include "pushsample.h"
 #include "qm_rps/pushovercalculators.h"

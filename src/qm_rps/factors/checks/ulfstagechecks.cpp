@@ -149,7 +149,15 @@ void AppendNamed(const std::string& item, const std::string& constraint,
 std::size_t RowThatCounts(const T_ULSI_D& item, std::size_t at, const T_MODEL& model)
 {
     const T_ULSI_ROW& row = item.rows[at];
-    if (!ReadsSum(row) && row.unknown && !row.pretension) return 0;
+    const auto isIncrement = [](const T_ULSI_ROW& r) {
+        return !ReadsSum(r) && r.unknown && !r.pretension;
+    };
+    if (isIncrement(row)) return 0;
+    for (std::size_t i = 0; i < at; ++i) { // of its own case at another place
+        const T_ULSI_ROW& before = item.rows[i];
+        const bool owns = !ReadsSum(row) && !ReadsSum(before) && !isIncrement(before);
+        if (owns && before.loadCase == row.loadCase) return i + 1;
+    }
     for (std::size_t i = 0; i < item.rows.size(); ++i) {
         const bool other = ReadsSum(row) ? i < at : i != at;
         if (other && ReadsSum(item.rows[i]) &&

@@ -201,8 +201,12 @@ std::string RemarkSection(const T_PUSH_EVALUATION& e)
     };
     if (std::ranges::any_of(e.limitStates, isNotMet))
         s += "* " + MMSGFunction::GetValue("IDS_QM_REPORT_NOT_MET") + "\n";
+    const auto isPrinted = [](const auto& m) {
+        return m.key == "IDS_RPS_FAILED_FINDING_PERFORMANCE_POINT" ||
+               m.key == "IDS_RPS_FAILED_FINDING_TARGET_DISPLACEMENT";
+    };
     for (const auto& m : e.messages)
-        if (!m.key.starts_with("IDS_RPS_FAILED_FINDING")) s += "* " + m.text + "\n";
+        if (!isPrinted(m)) s += "* " + m.text + "\n";
     if (s.empty()) return s;
     return "[ " + MMSGFunction::GetValue("IDS_QM_REPORT_REMARKS") + " ]\n" + s + "\n\n";
 }
