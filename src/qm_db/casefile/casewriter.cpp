@@ -44,7 +44,7 @@ void WriteTable(CJsonWriter& out, const CCaseNames& names, const T_RECORD_ROW<R>
     if (!row.member || (table.empty() && !std::is_same_v<R, T_NODE_D>)) return;
     out.Key(row.member);
     out.BeginArray();
-    int next = 1;
+    long long next = 1; // behind the largest key there is no other
     std::set<std::string> taken;
     for (const auto& [key, record] : table) {
         if (out.Failed()) return;
@@ -58,7 +58,7 @@ void WriteTable(CJsonWriter& out, const CCaseNames& names, const T_RECORD_ROW<R>
         // The place of a mode in the array is its number, which load patterns name.
         if (std::is_same_v<R, T_EIGV_D> && key != next)
             out.Fail("IDS_QM_CASE_MODE_NUMBERS", std::to_string(key));
-        next = key + 1;
+        next = static_cast<long long>(key) + 1;
     }
     out.EndArray();
 }
