@@ -5,14 +5,6 @@
 #include "qm_rps/desk/recordnames.h"
 #include "qm_rps/pushovercurvedampparamuser.h"
 
-namespace {
-
-/// Points of kappa that a new window starts with: type B of ATC-40 Table 8-1, 0.67 up to 25 per
-/// cent and 0.53 at 45 per cent.
-constexpr std::array<double, 4> kFirstUserDamping{25.0, 0.67, 45.0, 0.53};
-
-} // namespace
-
 std::vector<std::string> CPushOverCurveSub2Dlg::Spectra() const
 {
     return NamesOf(m_doc.Data().Model().spectra);
@@ -41,7 +33,7 @@ bool CPushOverCurveSub2Dlg::HasUserDamping() const
 int CPushOverCurveSub2Dlg::OnUserDamping()
 {
     CPushOverCurveDampParamUser points;
-    points.Data2Dlg(m_settings.userDamping.value_or(kFirstUserDamping));
+    points.Data2Dlg(m_settings.userDamping.value_or(std::array<double, 4>{})); // as it is evaluated
     points.SetView(View());
     if (!points.DoModal()) return 0;
     points.Dlg2Data(m_settings.userDamping.emplace());
