@@ -17,12 +17,14 @@ endif()
 
 # Optimised programs are hardened: what is read may have been made by anybody. Position independent as
 # -fPIC, not -fPIE: data of the Qt libraries must not be copied into the program.
-set(hardened $<AND:$<CONFIG:Release>,$<BOOL:${UNIX}>,$<NOT:$<BOOL:${QM_SANITIZE}>>>)
-target_compile_options(qm_flags INTERFACE
-  $<${hardened}:-fPIC> $<${hardened}:-fstack-protector-strong>
-  $<${hardened}:-U_FORTIFY_SOURCE> $<${hardened}:-D_FORTIFY_SOURCE=2>)
-target_link_options(qm_flags INTERFACE
-  $<${hardened}:-pie> $<${hardened}:LINKER:-z,relro> $<${hardened}:LINKER:-z,now>)
+if(UNIX AND NOT QM_SANITIZE)
+  target_compile_options(qm_flags INTERFACE
+    $<$<CONFIG:Release>:-fPIC> $<$<CONFIG:Release>:-fstack-protector-strong>
+    $<$<CONFIG:Release>:-U_FORTIFY_SOURCE> $<$<CONFIG:Release>:-D_FORTIFY_SOURCE=2>)
+  target_link_options(qm_flags INTERFACE
+    $<$<CONFIG:Release>:-pie> $<$<CONFIG:Release>:LINKER:-z,relro>
+    $<$<CONFIG:Release>:LINKER:-z,now>)
+endif()
 
 # qm_room(<name> SOURCES a.cpp ... [DEPENDS qm::x ...] [PRIVATE_DEPENDS lib ...])
 # makes the static library <name> with the alias qm::<short name>.

@@ -185,7 +185,8 @@ int CUlfDiagnosis::Explain(const T_ULF_PROBLEM& problem, T_ULF_EXPLANATION& out)
     if (!CheckUlfProblem(problem)) return 0;
     const T_ULF_ANSWER answer = SolveUlf(problem);
     if (answer.code != ULF_SOLVED && answer.code != ULF_RELAXED) return 0;
-    const T_ULF_SCALED scaled = ScaleUlf(problem);
+    const T_ULF_SCALED scaled =
+        answer.byWeights ? ScaleUlf(problem, UlfWeights(problem.weights)) : ScaleUlf(problem);
     T_ULF_EXPLANATION e{answer.x, answer.certificate.objective, HeldRows(problem, scaled, answer),
                         HeldSigns(problem, scaled, answer)};
     for (T_ULF_HELD& held : e.rows)

@@ -28,7 +28,6 @@ TEST_F(ExitCode, TellsWhyNothingWasDone)
         {"evaluate @first-steps --fast", 2},
         {"evaluate @first-steps --only", 2},
         {"evaluate @first-steps --only 'no such evaluation'", 2},
-        {"evaluate @first-steps --add-spectrum 'no such spectrum'", 2},
         {"compare @first-steps --push PX --spectrum none", 2},
         {"compare @first-steps --push none --spectrum ATC", 2},
         {"--lang de info @first-steps", 2},

@@ -103,6 +103,8 @@ TEST_F(PushoverWindows, TheWholeJobGivesTheReportOfTheCommandLine)
         ASSERT_EQ(job.stored, Result().eval.name);
         ChooseIndex(Field("spectrum"), job.spectrum);
         AnswerFileName(File("window")); // .txt is appended
+        for (const char* before : {"window.txt", "program.txt"})
+            QFile::remove(File(before));
         {
             CAnswers answers({SaveText()});
             Click(Field("report"));

@@ -12,6 +12,7 @@ struct T_ULF_ANSWER {
     std::vector<std::size_t> proof;       // codes 5 to 7: rows that together have no solution
     bool proofNeedsSign = false;          // ... and the sign restriction with them
     T_ULF_CERTIFICATE certificate;
+    bool byWeights = false; // found in the metric of the weights, not in that of ScaleUlf
     double quadratic = 0.0; // objectives 1 and 3: the quadratic term that was small enough
 };
 

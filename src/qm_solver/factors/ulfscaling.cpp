@@ -106,11 +106,7 @@ std::vector<long double> UlfColumnSizes(const T_ULF_PROBLEM& p)
     exponents.reserve(p.coefficients.size());
     for (const double entry : p.coefficients)
         exponents.push_back(std::fabs(entry) > 0.0 ? std::ilogb(entry) : kNoExponent);
-    // From the largest entry of each column: one that stands alone in its row would keep any size.
-    std::vector<int> column(n, kNoExponent);
-    for (std::size_t k = 0; k < exponents.size(); ++k)
-        column[k % n] = std::max(column[k % n], exponents[k]);
-    std::replace(column.begin(), column.end(), kNoExponent, 0);
+    std::vector<int> column(n, 0);
     for (int sweep = 0; sweep < kSweeps; ++sweep) {
         std::vector<int> most(n, kNoExponent);
         for (std::size_t i = 0; i < p.Rows(); ++i) {

@@ -58,6 +58,7 @@ CDialogWindow::CDialogWindow(const CViewFactory& factory, const T_VIEW& view,
 
 CDialogWindow::~CDialogWindow()
 {
+    m_form->m_onChange = nullptr; // the focus leaves the last field when the window goes
     m_model.SetView(m_before);
 }
 

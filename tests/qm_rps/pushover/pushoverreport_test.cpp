@@ -67,7 +67,9 @@ void Elastic(EVALUATION& e)
     e.loadCase.patternKind = 1;
     e.point = Point(5.0);
     e.loadCase.controlOption = 2;
-    e.messages = {{"K", "First."}, {"IDS_RPS_FAILED_FINDING_X", "stands above"}, {"L", "Second."}};
+    e.messages = {{"K", "First."},
+                  {"IDS_RPS_FAILED_FINDING_PERFORMANCE_POINT", "stands above"},
+                  {"L", "Second."}};
 }
 
 void Masonry(EVALUATION& e)
