@@ -124,10 +124,12 @@ T_TEXT_TABLE PushoverResultCells(const T_PUSH_EVALUATION& e)
     else
         AddPointCells(e, t);
     if (!e.curve.x.empty()) {
-        t.rows.push_back(
-            {MMSGFunction::GetValue("IDS_QM_UI_PUSH_LARGEST_X"), Number(e.curve.largestX)});
-        t.rows.push_back(
-            {MMSGFunction::GetValue("IDS_QM_UI_PUSH_LARGEST_Y"), Number(e.curve.largestY)});
+        const auto largest = [&](const std::string& title, double value) {
+            t.rows.push_back(
+                {MMSGFunction::Format("IDS_QM_UI_PUSH_LARGEST", {title}), Number(value)});
+        };
+        largest(PlotXTitle(e.curve.type, e.units), e.curve.largestX);
+        largest(PlotYTitle(e.curve.type, e.units), e.curve.largestY);
     }
     t.rows.push_back({"Gamma", Number(e.factors.gamma)});
     t.rows.push_back({"alpha", Number(e.factors.alpha)});
