@@ -140,6 +140,11 @@ void CFaults::Install()
     return p;
 }
 
+[[gnu::noinline]] void* operator new(std::size_t size, const std::nothrow_t&) noexcept
+{
+    return Fails(FAULT_KIND::Memory) ? nullptr : std::malloc(size);
+}
+
 [[gnu::noinline]] void operator delete(void* p) noexcept
 {
     std::free(p);
