@@ -145,6 +145,9 @@ EXIT_CODE RunHingeAxial(const T_HINGE_OPTIONS& o)
 
 EXIT_CODE RunHingeModelOptions(const T_HINGE_OPTIONS& o)
 {
+    if (const EXIT_CODE code = CheckOutputs(o.file, {{o.out, OUTPUT_KIND::Document}}, o.overwrite);
+        code != EXIT_CODE::Done)
+        return code;
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     CHingeOptionsDlg options(doc);

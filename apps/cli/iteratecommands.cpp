@@ -211,7 +211,11 @@ EXIT_CODE CheckOptions(const T_ITERATE_OPTIONS& o)
             return Complain(EXIT_CODE::NoAccess, copy + ": " + Say("IDS_QM_CLI_COPY_THERE"));
     if (!o.overwrite && !o.append && std::filesystem::exists(report, ignored))
         return Complain(EXIT_CODE::NoAccess, report + ": " + Say("IDS_QM_CLI_REPORT_THERE"));
-    return EXIT_CODE::Done;
+    std::vector<T_OUTPUT> outputs{{o.json, OUTPUT_KIND::Json}, {o.plot, OUTPUT_KIND::Picture}};
+    if (!o.append) outputs.push_back({report, OUTPUT_KIND::Text});
+    for (int i = 1; i <= o.iterations; ++i)
+        outputs.push_back({UlfIterCopyPath(o.file, i), OUTPUT_KIND::Document});
+    return CheckOutputs(o.file, outputs, o.overwrite);
 }
 
 EXIT_CODE WriteResults(const CUlfIteration& run, const T_ITERATE_OPTIONS& o,

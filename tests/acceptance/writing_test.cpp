@@ -51,6 +51,11 @@ TEST_F(Writing, RefusesToReplaceInputsAndWhatIsThere)
         {"ulf export @tuned-beam --item PROPS -o s.json", 2, ".xlsx"},
         {"ulf combine @tuned-beam --item PROPS --name X -o other.qmdb", 4, "--overwrite"},
         {"hinge assign @hinge-library --type 'steel beam' --elements 2 -o a", 2, ".qmdb"},
+        {"hinge options c.json --alpha1 0.02 0.02 --overwrite -o c.json", 2, "c.json"},
+        {"hinge options c.json --alpha1 0.02 0.02 -o other.qmdb", 4, "--overwrite"},
+        {"ulf iterate m.qmdb --item I --overwrite --json m.qmdb", 2, "m.qmdb"},
+        {"ulf iterate m.qmdb --item I --json m_01.qmdb", 2, "m_01.qmdb"},
+        {"ulf iterate m.qmdb --item I --json old.txt", 4, "--overwrite"},
     };
     for (const auto& row : kRows) {
         ExpectRefused(row.arguments, row.code, row.says);
