@@ -1,0 +1,93 @@
+// What the nonlinear push gives: stored steps, the vertices of the path, and how it ended.
+#pragma once
+
+#include "qm_solver/frameresult.h"
+#include "qm_solver/pushmodel.h"
+
+#include <functional>
+#include <span>
+
+namespace solver {
+
+/// Part of a backbone that a hinge component is on: 0 not yet flowed, k between vertex k and k + 1
+/// (counting from 1), the number of vertices beyond the last one. Negative side: negative.
+using T_HINGE_PLACE = int;
+
+struct T_HINGE_STATE {
+    double deformation = 0.0; // of the hinge, beyond the elastic member, with its sign
+    double force = 0.0;
+    T_HINGE_PLACE place = 0; // the furthest part of the side that is loaded or was loaded last
+};
+
+/// A stored step. Displacements and reactions are totals, the initial loads included.
+struct T_PUSH_STEP {
+    std::size_t stage = 0;
+    double loadFactor = 0.0;
+    double displacement = 0.0; // of the control, total
+    T_VEC6 base{};             // sum of the reactions, forces and moments about the origin, global
+    double residual = 0.0;     // forces out of balance over the largest force, whole structure
+    bool additional = false;   // asked for by the user
+    std::vector<T_VEC6> nodes; // displacements by node, global
+    std::vector<T_HINGE_STATE> hinges; // law after law, hinge after hinge
+    std::vector<double> axial;         // by hinge: axial force at its place, tension positive
+};
+
+enum class HINGE_TURN {
+    Point,  // reached a vertex of its backbone: `point` counts from 1 (yield)
+    Unload, // left the backbone
+    Reload, // came back to it
+};
+
+struct T_HINGE_EVENT {
+    std::size_t hinge = 0, law = 0;
+    HINGE_TURN turn = HINGE_TURN::Point;
+    int point = 0;        // of a vertex
+    bool positive = true; // side
+};
+
+/// A vertex of the path. Stage -1: the initial loads.
+struct T_PUSH_EVENT {
+    int stage = 0;
+    double loadFactor = 0.0, displacement = 0.0;
+    T_VEC6 base{};
+    std::vector<T_HINGE_EVENT> hinges;
+};
+
+enum class PUSH_OUTCOME {
+    Reached,       // the target
+    NoEquilibrium, // load control: the largest load that the structure carries
+    DriftStop,     // the stops that were asked for
+    PeakFractionStop,
+    StiffnessStop,
+    MarkStop,
+    StrengthLossStop,
+    LastPointStop,
+    InitialLoads,  // the structure does not carry them
+    NoPath,        // no way on: the hinges allow none in which they all go on loading
+    SnapBack,      // the control displacement fell back to its start
+    AxialStrength, // an axial force beyond the interaction curve of a hinge
+    TooManyEvents,
+    OutOfBalance, // a step does not keep equilibrium
+    Cancelled,
+};
+
+struct T_PUSH_END {
+    PUSH_OUTCOME outcome = PUSH_OUTCOME::Reached;
+    std::size_t stage = 0;
+    double loadFactor = 0.0, displacement = 0.0;
+    long hinge = -1; // the one that ended it, -1 none
+    long drift = -1; // entry of the model's drifts
+};
+
+/// Work of one run, for statements about its cost.
+struct T_PUSH_COST {
+    std::size_t events = 0, columns = 0, factorisations = 0, solves = 0;
+};
+
+/// Receives steps and events in their order while the run goes on.
+struct T_PUSH_SINK {
+    std::function<bool(const T_PUSH_STEP&)> step;   // false: cancel
+    std::function<void(const T_PUSH_EVENT&)> event; // may be empty
+};
+
+} // namespace solver
