@@ -117,16 +117,16 @@ void CBeamElement::Release(std::size_t at, double diagonal)
     m_releases.push_back(release);
 }
 
-void CBeamElement::Stiffness(T_MATRIX12& global) const
+void CBeamElement::ToNodes(const T_MATRIX12& local, T_MATRIX12& global) const
 {
     for (std::size_t bi = 0; bi < 12; bi += 3)
         for (std::size_t bj = bi; bj < 12; bj += 3) {
             double half[3][3]; // local block times axes
             for (std::size_t i = 0; i < 3; ++i)
                 for (std::size_t c = 0; c < 3; ++c)
-                    half[i][c] = m_local[bi + i][bj] * m_axes[0][c] +
-                                 m_local[bi + i][bj + 1] * m_axes[1][c] +
-                                 m_local[bi + i][bj + 2] * m_axes[2][c];
+                    half[i][c] = local[bi + i][bj] * m_axes[0][c] +
+                                 local[bi + i][bj + 1] * m_axes[1][c] +
+                                 local[bi + i][bj + 2] * m_axes[2][c];
             for (std::size_t r = 0; r < 3; ++r)
                 for (std::size_t c = 0; c < 3; ++c) {
                     const double k = m_axes[0][r] * half[0][c] + m_axes[1][r] * half[1][c] +
@@ -170,8 +170,6 @@ T_VEC12 CBeamElement::FixedEndForces(std::span<const T_SPAN_LOAD> loads, double 
     return forces;
 }
 
-/// Displacements of the nodes taken to the ends of the flexible length, local axes, released or
-/// not.
 T_VEC12 CBeamElement::EndDisplacements(const T_VEC12& displacement) const
 {
     T_VEC12 local;

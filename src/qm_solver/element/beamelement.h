@@ -34,7 +34,21 @@ public:
     int Loose() const { return m_loose; }
 
     /// Over the displacements of the nodes, global axes.
-    void Stiffness(T_MATRIX12& global) const;
+    void Stiffness(T_MATRIX12& global) const { ToNodes(m_local, global); }
+    /// Over the displacements of the ends, local axes, releases condensed.
+    const T_MATRIX12& Local() const { return m_local; }
+    /// A stiffness over the displacements of the ends, local axes, taken to those of the nodes.
+    void ToNodes(const T_MATRIX12& local, T_MATRIX12& global) const;
+    /// Displacements of the ends, local axes, less the motion of a rigid body: what strains the
+    /// beam. 0 where that takes all.
+    T_VEC12 Strains(const T_VEC12& displacement) const
+    {
+        return Deformation(displacement, {}).strain;
+    }
+    /// Displacements of the nodes taken to the ends of the flexible length, local axes, released or
+    /// not.
+    T_VEC12 EndDisplacements(const T_VEC12& displacement) const;
+    double Length() const { return m_shape.length; }
 
     /// Twice the strain energy under displacements of the nodes, global axes. From the deformations
     /// of the beam, so that a rigid-body motion leaves only the square of its rounding, and what a
@@ -80,7 +94,6 @@ private:
         double chordY = 0.0, chordZ = 0.0; // rotation of the chord
     };
     T_DEFORMATION Deformation(const T_VEC12& displacement, const T_VEC12& rest) const;
-    T_VEC12 EndDisplacements(const T_VEC12& displacement) const;
     void MakeLocalStiffness(const T_MATERIAL& material, const T_SECTION& section);
     void Release(std::size_t at, double diagonal);
     void MoveToNodes(T_MATRIX12& global, std::size_t first, const T_VEC3& offset) const;

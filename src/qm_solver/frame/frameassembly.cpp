@@ -160,11 +160,18 @@ void CFrameAssembly::MakePlaces(const CPattern& pattern)
 
 void CFrameAssembly::Assemble(const T_FRAME& frame, std::span<const T_AXIAL> axial)
 {
+    Assemble([&](std::size_t e, T_MATRIX12& stiffness) {
+        ElementStiffness(frame, frame.elements[e], axial.empty() ? T_AXIAL{} : axial[e], stiffness);
+    });
+}
+
+void CFrameAssembly::Assemble(const std::function<void(std::size_t, T_MATRIX12&)>& elementStiffness)
+{
     std::fill(m_matrix.value.begin(), m_matrix.value.end(), 0.0);
     T_MATRIX12 stiffness;
-    for (std::size_t e = 0; e < frame.elements.size(); ++e) {
+    for (std::size_t e = 0; e + 1 < m_starts.size(); ++e) {
         if (m_starts[e].unknowns == 0) continue;
-        ElementStiffness(frame, frame.elements[e], axial.empty() ? T_AXIAL{} : axial[e], stiffness);
+        elementStiffness(e, stiffness);
         if (m_starts[e].plain)
             AddPlain(e, stiffness);
         else

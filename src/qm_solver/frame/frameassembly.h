@@ -7,6 +7,7 @@
 #include "qm_solver/sparse/sparsefactor.h"
 
 #include <cstdint>
+#include <functional>
 #include <string>
 #include <vector>
 
@@ -24,6 +25,8 @@ public:
                               T_SOLVER_REASON& reason);
     /// Values of the matrix from the elements' stiffness; axial by element, empty: first order.
     void Assemble(const T_FRAME& frame, std::span<const T_AXIAL> axial = {});
+    /// Values from the stiffness of each element over the displacements of its nodes, global axes.
+    void Assemble(const std::function<void(std::size_t element, T_MATRIX12&)>& stiffness);
     const T_SYMMETRIC_MATRIX& Matrix() const { return m_matrix; }
 
 private:

@@ -1,0 +1,240 @@
+#include "qm_solver/push/pushelement.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace solver {
+
+namespace {
+
+T_VEC12 Times(const T_MATRIX12& a, const T_VEC12& x)
+{
+    T_VEC12 y{};
+    for (std::size_t i = 0; i < 12; ++i)
+        for (std::size_t j = 0; j < 12; ++j)
+            y[i] += a[i][j] * x[j];
+    return y;
+}
+
+double Product(const T_VEC12& a, const T_VEC12& b)
+{
+    double sum = 0.0;
+    for (std::size_t i = 0; i < 12; ++i)
+        sum += a[i] * b[i];
+    return sum;
+}
+
+void Add(T_VEC12& a, const T_VEC12& b, double factor)
+{
+    for (std::size_t i = 0; i < 12; ++i)
+        a[i] += factor * b[i];
+}
+
+bool IsAtJ(double at)
+{
+    return at >= 1.0;
+}
+
+} // namespace
+
+CPushElement::CPushElement(const T_FRAME& frame, std::size_t element,
+                           std::vector<T_PLACED_COMPONENT> components)
+    : m_element(frame.elements[element]), m_components(std::move(components))
+{
+    if (m_element.kind == ELEMENT_KIND::Beam) {
+        m_beam.emplace(frame, m_element);
+        m_stiffness = m_beam->Local();
+        m_length = m_beam->Length();
+    } else {
+        ElementStiffness(frame, m_element, {}, m_stiffness);
+        if (m_element.kind == ELEMENT_KIND::Truss)
+            m_direction = TrussDirection(frame, m_element, m_length);
+    }
+    for (const T_PLACED_COMPONENT& c : m_components)
+        m_motion.push_back(Motion(c));
+    CondenseSprings();
+    MakeInfluence();
+}
+
+/// Motion of the ends that strains the element as a unit jump at the place does. Told at the end
+/// that is nearer, so that forces there follow without the loads on the span.
+T_VEC12 CPushElement::Motion(const T_PLACED_COMPONENT& c) const
+{
+    T_VEC12 motion{};
+    const auto d = static_cast<std::size_t>(c.component);
+    switch (m_element.kind) {
+    case ELEMENT_KIND::Beam:
+        if (IsAtJ(c.at)) {
+            motion[6 + d] = -1.0;
+            break;
+        }
+        motion[d] = 1.0;
+        if (d > 3) { // the part before a kink turns about it: rotation x (-x, 0, 0)
+            const double x = c.at * m_length;
+            motion[d == 4 ? 2 : 1] = d == 4 ? x : -x;
+        }
+        break;
+    case ELEMENT_KIND::Truss:
+        AddPart(motion, 0, m_direction);
+        break;
+    case ELEMENT_KIND::Link:
+        motion[d] = 1.0;
+        break;
+    case ELEMENT_KIND::Spring: // the force of the node on the ground, positive as it moves
+        motion[d] = -1.0;
+        break;
+    }
+    return motion;
+}
+
+/// One spring after the other; each finds the element as the springs before it have left it.
+void CPushElement::CondenseSprings()
+{
+    if (std::none_of(m_components.begin(), m_components.end(),
+                     [](const T_PLACED_COMPONENT& c) { return c.spring > 0.0; }))
+        return;
+    m_spring.resize(Size());
+    for (std::size_t c = 0; c < Size(); ++c) {
+        if (m_components[c].spring <= 0.0) continue;
+        const T_VEC12 forces = Times(m_stiffness, m_motion[c]);
+        const double pivot = m_components[c].spring + Product(m_motion[c], forces);
+        for (std::size_t i = 0; i < 12; ++i)
+            m_spring[c][i] = forces[i] / pivot;
+        for (std::size_t i = 0; i < 12; ++i)
+            for (std::size_t j = 0; j < 12; ++j)
+                m_stiffness[i][j] -= m_spring[c][i] * forces[j];
+    }
+}
+
+void CPushElement::MakeInfluence()
+{
+    m_own.resize(Size() * Size());
+    for (std::size_t c = 0; c < Size(); ++c) {
+        T_VEC12 forces = Times(m_stiffness, m_motion[c]);
+        for (std::size_t d = 0; d < Size(); ++d)
+            m_own[d * Size() + c] = Product(m_motion[d], forces);
+        for (double& f : forces)
+            f = -f;
+        m_influence.push_back(m_beam ? m_beam->AtNodes(forces) : forces);
+    }
+}
+
+void CPushElement::Stiffness(double tension, T_MATRIX12& global) const
+{
+    if (!m_beam) {
+        global = m_stiffness;
+        if (m_element.kind != ELEMENT_KIND::Truss || tension == 0.0) return;
+        const double across = tension / m_length;
+        for (std::size_t r = 0; r < 3; ++r)
+            for (std::size_t c = 0; c < 3; ++c) {
+                const double value =
+                    across * ((r == c ? 1.0 : 0.0) - m_direction[r] * m_direction[c]);
+                global[r][c] += value;
+                global[6 + r][6 + c] += value;
+                global[r][6 + c] -= value;
+                global[6 + r][c] -= value;
+            }
+        return;
+    }
+    T_MATRIX12 local = m_stiffness;
+    const double across = tension / m_length;
+    for (const std::size_t d : {1u, 2u}) {
+        local[d][d] += across;
+        local[6 + d][6 + d] += across;
+        local[d][6 + d] -= across;
+        local[6 + d][d] -= across;
+    }
+    m_beam->ToNodes(local, global);
+}
+
+/// Between clamped ends the spring of a hinge deforms by what the loads do at its place.
+T_ELEMENT_LOADS CPushElement::Loads(std::span<const T_SPAN_LOAD> loads, double axial) const
+{
+    T_ELEMENT_LOADS out;
+    out.force.resize(Size());
+    if (m_beam) {
+        out.ends = m_beam->FixedEndForces(loads, axial);
+    } else if (m_element.kind == ELEMENT_KIND::Truss) {
+        AddPart(out.ends, 0, Scaled(m_direction, -axial));
+        AddPart(out.ends, 6, Scaled(m_direction, axial));
+    }
+    std::vector<double> inside(Size()); // of the loads on the span alone
+    for (std::size_t c = 0; c < Size(); ++c)
+        if (m_beam && !IsAtJ(m_components[c].at))
+            inside[c] = m_beam->InternalForces(
+                {}, loads, m_components[c].at)[static_cast<std::size_t>(m_components[c].component)];
+    const auto force = [&](std::size_t c) { return inside[c] - Product(m_motion[c], out.ends); };
+    // The gain of a spring was made for k as the earlier springs left it: so are the loads.
+    for (std::size_t c = 0; c < m_spring.size(); ++c)
+        if (m_components[c].spring > 0.0) Add(out.ends, m_spring[c], force(c));
+    for (std::size_t c = 0; c < Size(); ++c)
+        out.force[c] = force(c);
+    return out;
+}
+
+/// What the nodes give to the element, from its deformations: a rigid-body motion leaves nothing.
+T_VEC12 CPushElement::Ends(const T_VEC12& displacement, std::span<const double> plastic,
+                           const T_VEC12& loads) const
+{
+    T_VEC12 motion = m_beam ? m_beam->Strains(displacement) : displacement;
+    for (std::size_t c = 0; c < Size(); ++c)
+        if (plastic[c] != 0.0) Add(motion, m_motion[c], plastic[c]);
+    T_VEC12 forces = Times(m_stiffness, motion);
+    Add(forces, loads, 1.0);
+    return forces;
+}
+
+T_VEC12 CPushElement::Across(const T_VEC12& displacement, double tension) const
+{
+    T_VEC12 forces{};
+    const double across = tension / m_length;
+    if (m_beam) {
+        const T_VEC12 ends = m_beam->EndDisplacements(displacement);
+        for (const std::size_t d : {1u, 2u}) {
+            forces[d] = across * (ends[d] - ends[6 + d]);
+            forces[6 + d] = -forces[d];
+        }
+        return m_beam->AtNodes(forces);
+    }
+    const T_VEC3 drift = Minus(Part(displacement, 0), Part(displacement, 6));
+    const T_VEC3 sideways = Minus(drift, Scaled(m_direction, Dot(drift, m_direction)));
+    AddPart(forces, 0, Scaled(sideways, across));
+    AddPart(forces, 6, Scaled(sideways, -across));
+    return forces;
+}
+
+T_VEC12 CPushElement::AtNodes(const T_VEC12& displacement, std::span<const double> plastic,
+                              const T_VEC12& loads, double tension) const
+{
+    T_VEC12 forces = Ends(displacement, plastic, loads);
+    if (m_beam) forces = m_beam->AtNodes(forces);
+    if (tension != 0.0) Add(forces, Across(displacement, tension), 1.0);
+    return forces;
+}
+
+double CPushElement::Tension(const T_VEC12& displacement, std::span<const double> plastic,
+                             const T_VEC12& loads) const
+{
+    const T_VEC12 ends = Ends(displacement, plastic, loads);
+    if (m_beam) return 0.5 * (ends[6] - ends[0]);
+    if (m_element.kind != ELEMENT_KIND::Truss) return 0.0;
+    return 0.5 * Dot(m_direction, Minus(Part(ends, 6), Part(ends, 0)));
+}
+
+T_VEC6 CPushElement::Inside(const T_VEC12& displacement, std::span<const double> plastic,
+                            const T_VEC12& loads, std::span<const T_SPAN_LOAD> span, double s) const
+{
+    const T_VEC12 ends = Ends(displacement, plastic, loads);
+    if (m_beam) return m_beam->InternalForces(ends, span, s);
+    T_VEC6 inside{};
+    if (m_element.kind == ELEMENT_KIND::Truss) {
+        inside[0] = Dot(m_direction, Part(ends, 6));
+    } else if (m_element.kind == ELEMENT_KIND::Link) {
+        std::copy_n(ends.begin() + 6, 6, inside.begin());
+    } else {
+        std::copy_n(ends.begin(), 6, inside.begin());
+    }
+    return inside;
+}
+
+} // namespace solver

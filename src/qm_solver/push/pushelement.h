@@ -1,0 +1,83 @@
+// An element with the places of its hinges: how their plastic deformations and springs act on it.
+#pragma once
+
+#include "qm_solver/element/beamelement.h"
+#include "qm_solver/element/elementstiffness.h"
+#include "qm_solver/frame/caseloads.h"
+
+#include <optional>
+#include <span>
+#include <vector>
+
+namespace solver {
+
+/// A component of the internal forces at a place of an element that is watched or flows.
+struct T_PLACED_COMPONENT {
+    double at = 0.0; // fraction of the flexible length
+    int component = 0;
+    double spring = 0.0; // in series with the element; 0: none
+};
+
+/// What loads do to an element whose nodes stand still and whose hinges do not flow.
+struct T_ELEMENT_LOADS {
+    T_VEC12 ends{};            // forces at its nodes, global axes; of beams: ends, local axes
+    std::vector<double> force; // by component
+};
+
+/// Elastic stiffness with the springs of the hinges in series, over the displacements of the nodes;
+/// influence of plastic deformations; forces. A plastic deformation is the jump of displacement or
+/// rotation across the hinge, the side towards J less that towards I, so that force times
+/// deformation is its work. Springs are condensed: with C the motion of the ends that stands for
+/// unit jumps, k' = k - k C (K0 + C' k C)^-1 C' k. P-Delta is the couple of the axial force and the
+/// drift of the chord, N / L across, which no plastic deformation changes.
+class CPushElement {
+public:
+    CPushElement(const T_FRAME& frame, std::size_t element,
+                 std::vector<T_PLACED_COMPONENT> components);
+
+    std::size_t Size() const { return m_components.size(); }
+    /// Over the displacements of the nodes, global axes; tension: of P-Delta, 0 none.
+    void Stiffness(double tension, T_MATRIX12& global) const;
+    /// Loads at the nodes by a unit plastic deformation of component c; also its force by unit
+    /// displacements of the nodes.
+    const T_VEC12& Influence(std::size_t c) const { return m_influence[c]; }
+    /// Force of component c that a unit plastic deformation of component d takes away while the
+    /// nodes stand still.
+    double Own(std::size_t c, std::size_t d) const { return m_own[c * Size() + d]; }
+
+    /// axial: the tension that it would have between clamped ends from initial strains.
+    T_ELEMENT_LOADS Loads(std::span<const T_SPAN_LOAD> loads, double axial) const;
+    /// Forces of the element on its nodes with the opposite sign (what the nodes need), global
+    /// axes, under displacements of the nodes and plastic deformations of its components; with
+    /// P-Delta.
+    T_VEC12 AtNodes(const T_VEC12& displacement, std::span<const double> plastic,
+                    const T_VEC12& loads, double tension) const;
+    /// Internal forces at fraction s, by the same.
+    T_VEC6 Inside(const T_VEC12& displacement, std::span<const double> plastic,
+                  const T_VEC12& loads, std::span<const T_SPAN_LOAD> span, double s) const;
+
+    /// Mean of the axial forces of both ends, tension positive; 0 of links and springs.
+    double Tension(const T_VEC12& displacement, std::span<const double> plastic,
+                   const T_VEC12& loads) const;
+
+private:
+    T_VEC12 Motion(const T_PLACED_COMPONENT& component) const;
+    void CondenseSprings();
+    void MakeInfluence();
+    T_VEC12 Ends(const T_VEC12& displacement, std::span<const double> plastic,
+                 const T_VEC12& loads) const;
+    T_VEC12 Across(const T_VEC12& displacement, double tension) const;
+
+    T_ELEMENT m_element;
+    std::vector<T_PLACED_COMPONENT> m_components;
+    std::optional<CBeamElement> m_beam;
+    T_VEC3 m_direction{};
+    double m_length = 1.0;
+    T_MATRIX12 m_stiffness{};      // of beams: local, over the ends; of others: global
+    std::vector<T_VEC12> m_motion; // of the ends by a unit jump
+    std::vector<T_VEC12> m_spring; // by component: gain of its spring, empty without springs
+    std::vector<T_VEC12> m_influence;
+    std::vector<double> m_own;
+};
+
+} // namespace solver

@@ -1,0 +1,98 @@
+// Yield conditions of the hinges: what flows, when, and in which direction.
+#pragma once
+
+#include "qm_solver/push/hingebackbone.h"
+#include "qm_solver/push/pushstructure.h"
+
+#include <array>
+
+namespace solver {
+
+/// A factor at a row of the structure.
+struct T_FLOW_TERM {
+    std::size_t row = 0;
+    double factor = 0.0;
+};
+
+/// A strength by axial force, straight between its points, and the part that counts now. At a
+/// corner the direction in which the axial force goes decides.
+class CAxialLine {
+public:
+    struct T_POINT {
+        double axial, strength;
+    };
+    CAxialLine() = default;
+    explicit CAxialLine(std::vector<T_POINT> points) : m_points(std::move(points)) {}
+
+    bool IsGiven() const { return m_points.size() > 1; }
+    /// Takes the part that holds `axial`; at a corner that into which `rate` leads.
+    void Choose(double axial, double rate);
+    double Value(double axial) const;
+    double Slope() const;
+    /// Axial force at which the part ends in the direction of `rate`; infinite with rate 0.
+    double Corner(double rate) const;
+    /// The corner of that direction is the end of the line.
+    bool IsLast(double rate) const;
+    double Width() const { return m_points.back().axial - m_points.front().axial; }
+
+private:
+    std::vector<T_POINT> m_points;
+    std::size_t m_part = 0;
+};
+
+/// One condition: phi = value - scale * resistance <= 0. Of a side of a law the value is its force,
+/// the scale the strength at the present axial force over that of its backbone. Of a face of a
+/// biaxial hinge value = c My / Sy(N) + s Mz / Sz(N), times a strength of reference, and the scale
+/// is the distance of the face from the centre.
+class CPushFlow {
+public:
+    std::size_t hinge = 0, law = 0; // law: the one whose backbone it follows
+    bool positive = true;
+    std::size_t backbone = 0; // several faces share none: one each
+    double force = 1.0;       // of reference: strength of the backbone
+    double stiffness = 1.0;   // elastic, of the element with its nodes held
+    bool associated = false;
+
+    /// A side of a law: row of its force; axial row and line of strength over that of the backbone.
+    void SetSide(std::size_t row, bool isPositive, std::size_t axialRow, CAxialLine ratio);
+    /// A face: rows of My and Mz, direction cosines of its normal, strengths by axial force.
+    void SetFace(std::array<std::size_t, 2> rows, std::array<double, 2> normal, double distance,
+                 std::array<double, 2> strength, std::size_t axialRow,
+                 std::array<CAxialLine, 2> ratios);
+
+    double Value(std::span<const double> s) const;
+    double Scale(std::span<const double> s) const;
+    /// Derivatives of phi by the forces of rows, the resistance given. Holds until the next call.
+    std::span<const T_FLOW_TERM> Gradient(std::span<const double> s, double resistance) const;
+    /// Plastic deformation of rows by unit flow.
+    std::span<const T_FLOW_TERM> Direction(std::span<const double> s, double resistance) const;
+
+    bool HangsOnAxial() const { return m_lines[0].IsGiven() || m_lines[1].IsGiven(); }
+    std::size_t AxialRow() const { return m_axialRow; }
+    std::array<CAxialLine, 2>& Lines() { return m_lines; }
+    const std::array<CAxialLine, 2>& Lines() const { return m_lines; }
+    std::span<const std::size_t> Rows() const { return {m_rows.data(), m_count}; }
+
+private:
+    double Weight(std::size_t k, double axial) const;
+    double Axial(std::span<const double> s) const { return HangsOnAxial() ? s[m_axialRow] : 0.0; }
+
+    std::array<std::size_t, 2> m_rows{};
+    std::size_t m_count = 1, m_axialRow = 0;
+    std::array<double, 2> m_normal{1.0, 0.0}, m_strength{1.0, 1.0};
+    double m_distance = 1.0;
+    std::array<CAxialLine, 2> m_lines;
+    mutable std::array<T_FLOW_TERM, 3> m_gradient{}, m_direction{}; // of the last call
+};
+
+/// The flows of all hinges of a model, with their backbones.
+struct T_PUSH_FLOWS {
+    std::vector<CPushFlow> flows;
+    std::vector<CHingeBackbone> backbones;
+};
+T_PUSH_FLOWS MakeFlows(const T_PUSH_MODEL& model, const CPushStructure& structure);
+
+/// Faces of the polygon of a biaxial hinge.
+inline constexpr std::size_t kFaces = 16;
+
+} // namespace solver

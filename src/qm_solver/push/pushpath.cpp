@@ -1,0 +1,312 @@
+#include "qm_solver/push/pushpath.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace solver {
+
+namespace {
+
+constexpr double kNear = 1e-10;    // of strength, or of elastic deformation: at an event
+constexpr double kSettled = 1e-13; // of strengths: yield conditions are met
+constexpr int kMostCorrections = 12;
+
+using ON = CHingeBackbone::ON;
+
+} // namespace
+
+CPushPath::CPushPath(const T_PUSH_MODEL& model, CPushStructure& structure)
+    : m_model(model), m_structure(structure), m_flows(MakeFlows(model, structure)),
+      m_place(m_flows.flows.size(), 0), m_columnOf(structure.RowCount(), nullptr),
+      m_force(structure.RowCount(), 0.0), m_plastic(structure.RowCount(), 0.0)
+{
+    m_isCurved = std::any_of(m_flows.flows.begin(), m_flows.flows.end(),
+                             [](const CPushFlow& flow) { return flow.HangsOnAxial(); });
+}
+
+bool CPushPath::LoadGrows(double part) const
+{
+    const std::vector<double>& loads = m_structure.Loads(m_factors.size() - 1).force;
+    double most = 0.0;
+    for (const CPushFlow& flow : m_flows.flows)
+        for (const std::size_t r : flow.Rows())
+            most = std::max(most, std::fabs(loads[r]) / flow.force);
+    return m_rate.factor > 0.0 && m_rate.factor * most >= part * Norm();
+}
+
+std::size_t CPushPath::Watch(T_PROBE probe)
+{
+    m_watches.push_back({std::move(probe), 0.0, 0.0, {}});
+    return m_watches.size() - 1;
+}
+
+CPushPath::T_FAULT CPushPath::BeginStage(std::size_t set, std::optional<std::size_t> control)
+{
+    m_factors.resize(set + 1, 0.0);
+    m_control = control;
+    m_border = control ? 0 : 1;
+    m_before.clear();
+    m_rate.force.clear();
+    return Renew();
+}
+
+/// What the answers of the structure make of the state.
+CPushPath::T_FAULT CPushPath::Renew()
+{
+    m_columns.clear();
+    std::fill(m_columnOf.begin(), m_columnOf.end(), nullptr);
+    for (T_WATCH& w : m_watches) {
+        w.byLoads.clear();
+        for (std::size_t l = 0; l < m_structure.LoadCount(); ++l)
+            w.byLoads.push_back(m_structure.Value(w.probe, m_structure.Loads(l).unknowns));
+    }
+    std::vector<char> wanted(m_structure.RowCount());
+    for (std::size_t r = 0; r < wanted.size(); ++r)
+        wanted[r] = m_plastic[r] != 0.0;
+    for (const std::size_t f : m_active)
+        for (const T_FLOW_TERM& d : m_flows.flows[f].Direction(m_force, Resistance(f)))
+            wanted[d.row] = 1;
+    std::vector<std::size_t> rows;
+    for (std::size_t r = 0; r < wanted.size(); ++r)
+        if (wanted[r]) rows.push_back(r);
+    if (!rows.empty())
+        if (auto fault = Fetch(rows)) return fault;
+    SumUp();
+    return Rebuild();
+}
+
+CPushPath::T_FAULT CPushPath::Rebuild()
+{
+    const std::size_t set = m_factors.size() - 1;
+    m_system.Reset(m_border == 0 ? m_watches[*m_control].byLoads[set] : m_border == 1 ? 1.0 : 0.0);
+    const std::vector<std::size_t> active = std::move(m_active);
+    m_active.clear();
+    for (const std::size_t f : active)
+        m_place[f] = 0;
+    for (const std::size_t f : active)
+        if (auto fault = Activate(f)) return fault;
+    return {};
+}
+
+void CPushPath::SumUp()
+{
+    std::fill(m_force.begin(), m_force.end(), 0.0);
+    for (T_WATCH& w : m_watches)
+        w.value = 0.0;
+    for (std::size_t l = 0; l < m_factors.size(); ++l) {
+        const std::vector<double>& loads = m_structure.Loads(l).force;
+        for (std::size_t r = 0; r < m_force.size(); ++r)
+            m_force[r] += m_factors[l] * loads[r];
+        for (T_WATCH& w : m_watches)
+            w.value += m_factors[l] * w.byLoads[l];
+    }
+    for (std::size_t c = 0; c < m_plastic.size(); ++c) {
+        const double q = m_plastic[c];
+        if (q == 0.0) continue;
+        const double* column = m_columnOf[c]->force.data();
+        for (std::size_t r = 0; r < m_force.size(); ++r)
+            m_force[r] += q * column[r];
+        for (std::size_t w = 0; w < m_watches.size(); ++w)
+            m_watches[w].value += q * m_columnOf[c]->watch[w];
+    }
+}
+
+void CPushPath::ChoosePart(std::size_t f)
+{
+    CPushFlow& flow = m_flows.flows[f];
+    const double rate = m_rate.force.empty() ? 0.0 : m_rate.force[flow.AxialRow()];
+    for (CAxialLine& line : flow.Lines())
+        if (line.IsGiven()) line.Choose(m_force[flow.AxialRow()], rate);
+}
+
+double CPushPath::NextEvent() const
+{
+    const double least = Least();
+    double first = CHingeBackbone::kFar;
+    const auto take = [&](double distance, double rate) {
+        first = std::min(first, std::max(0.0, distance) / rate);
+    };
+    for (std::size_t f = 0; f < m_flows.flows.size(); ++f) {
+        const CPushFlow& flow = m_flows.flows[f];
+        const CHingeBackbone& backbone = Backbone(f);
+        const bool flows = IsActive(f);
+        const double rate = flows ? m_rate.flow[m_place[f] - 1] : PhiRate(f);
+        const double size = rate * (flows ? flow.stiffness : 1.0) / flow.force;
+        if (flows && size > least) take(backbone.Room(true), rate);
+        if (flows && size < -least && backbone.On() == ON::Back) take(backbone.Room(false), -rate);
+        if (backbone.On() == ON::Locked && size > least) take(-Phi(f, backbone.Upper()), rate);
+        if (backbone.On() == ON::Locked && size < -least &&
+            backbone.Lower() > -CHingeBackbone::kFar)
+            take(Phi(f, backbone.Lower()), -rate);
+        if (backbone.On() == ON::Drop && size < -least) take(Phi(f, backbone.Force()), -rate);
+        if (!flow.HangsOnAxial()) continue;
+        const double axial = m_force[flow.AxialRow()], goes = m_rate.force[flow.AxialRow()];
+        for (const CAxialLine& line : flow.Lines())
+            if (line.IsGiven() && std::fabs(goes) > least * 1e-3 * line.Width())
+                take((line.Corner(goes) - axial) * (goes > 0.0 ? 1.0 : -1.0), std::fabs(goes));
+    }
+    return first;
+}
+
+void CPushPath::Advance(double by)
+{
+    m_factors.back() += by * m_rate.factor;
+    for (std::size_t r = 0; r < m_force.size(); ++r)
+        m_force[r] += by * m_rate.force[r];
+    for (std::size_t r = 0; r < m_plastic.size(); ++r)
+        m_plastic[r] += by * m_rate.plastic[r];
+    for (std::size_t k = 0; k < m_active.size(); ++k)
+        Backbone(m_active[k]).Flow(by * m_rate.flow[k]);
+    for (T_WATCH& w : m_watches)
+        w.value += by * w.rate;
+}
+
+long CPushPath::Turn()
+{
+    const double least = Least();
+    std::vector<std::size_t> begun;
+    long outside = -1;
+    for (std::size_t f = 0; f < m_flows.flows.size(); ++f) {
+        const CPushFlow& flow = m_flows.flows[f];
+        CHingeBackbone& backbone = Backbone(f);
+        const double near = kNear * flow.force, close = near / flow.stiffness;
+        const bool flows = IsActive(f);
+        const double rate = flows ? m_rate.flow[m_place[f] - 1] * flow.stiffness : PhiRate(f);
+        const double size = rate / flow.force;
+        const auto turn = [&](auto&& change) {
+            Touch(f);
+            change();
+            begun.push_back(f);
+        };
+        switch (backbone.On()) {
+        case ON::Locked:
+            if (size > least && Phi(f, backbone.Upper()) >= -near)
+                turn([&] { backbone.Start(true); });
+            else if (size < -least && backbone.Lower() > -CHingeBackbone::kFar &&
+                     Phi(f, backbone.Lower()) <= near)
+                turn([&] { backbone.Start(false); });
+            break;
+        case ON::Virgin:
+        case ON::Back:
+            if (size > least && backbone.Room(true) <= close)
+                turn([&] { backbone.End(true); });
+            else if (backbone.On() == ON::Back && size < -least && backbone.Room(false) <= close)
+                turn([&] { backbone.End(false); });
+            break;
+        case ON::Drop:
+            if (size < -least && Phi(f, backbone.Force()) <= near)
+                turn([&] { backbone.EndDrop(); });
+            break;
+        }
+        if (!flow.HangsOnAxial()) continue;
+        const double axial = m_force[flow.AxialRow()], goes = m_rate.force[flow.AxialRow()];
+        for (const CAxialLine& line : flow.Lines())
+            if (line.IsGiven() && goes != 0.0 && line.IsLast(goes) &&
+                std::fabs(line.Corner(goes) - axial) <= kNear * line.Width())
+                outside = static_cast<long>(flow.hinge);
+        ChoosePart(f);
+    }
+    TakeDrive(begun);
+    return outside;
+}
+
+/// A drop goes down to its end, whatever else begins on the way.
+void CPushPath::TakeDrive(std::span<const std::size_t> begun)
+{
+    T_PUSH_DRIVE drive;
+    for (std::size_t f = 0; f < m_flows.flows.size(); ++f)
+        if (Backbone(f).On() == ON::Drop) drive.flows.push_back(f);
+    if (!drive.flows.empty()) {
+        drive.kind = T_PUSH_DRIVE::KIND::Forces;
+        drive.sign = -1.0;
+        m_drive = std::move(drive);
+        return;
+    }
+    for (const std::size_t f : begun)
+        if (Backbone(f).On() == ON::Virgin) drive.flows.push_back(f);
+    drive.kind = drive.flows.empty() ? T_PUSH_DRIVE::KIND::Before : T_PUSH_DRIVE::KIND::Flows;
+    m_drive = std::move(drive);
+}
+
+CPushPath::T_FAULT CPushPath::SyncTouched()
+{
+    for (const auto& [f, was] : m_touched)
+        if (auto fault = Sync(f)) return fault;
+    return {};
+}
+
+std::vector<T_HINGE_EVENT> CPushPath::TakeTurned()
+{
+    std::sort(m_turned.begin(), m_turned.end(), [](const T_HINGE_EVENT& a, const T_HINGE_EVENT& b) {
+        return std::tie(a.hinge, a.law) < std::tie(b.hinge, b.law);
+    });
+    return std::exchange(m_turned, {});
+}
+
+CPushPath::T_FAULT CPushPath::Correct(std::optional<double> control)
+{
+    std::vector<double> right, x;
+    for (int tries = 0; tries < kMostCorrections; ++tries) {
+        SumUp();
+        right.assign(m_system.Size(), 0.0);
+        double worst = 0.0;
+        if (control && m_control && m_border == 0) {
+            right[0] = *control - m_watches[*m_control].value;
+            if (right[0] != 0.0) worst = std::fabs(right[0] / *control);
+        }
+        for (std::size_t k = 0; k < m_active.size(); ++k) {
+            const std::size_t f = m_active[k];
+            right[k + 1] = Phi(f, Resistance(f));
+            worst = std::max(worst, std::fabs(right[k + 1]) / m_flows.flows[f].force);
+        }
+        if (worst <= kSettled) return {};
+        if (tries > 0)
+            if (auto fault = Rebuild()) return fault; // slopes may hang on the forces
+        if (!m_system.Solve(right, x)) return {};
+        m_factors.back() += x[0];
+        for (std::size_t k = 0; k < m_active.size(); ++k) {
+            const std::size_t f = m_active[k];
+            for (const T_FLOW_TERM& d : m_flows.flows[f].Direction(m_force, Resistance(f)))
+                m_plastic[d.row] += d.factor * x[k + 1];
+            Backbone(f).Flow(x[k + 1]);
+        }
+    }
+    SumUp();
+    return {};
+}
+
+double CPushPath::Deformation(std::size_t hinge, std::size_t law, double& rate) const
+{
+    const std::size_t row = m_structure.RowOf(hinge, law);
+    const double spring = m_model.hinges[hinge].laws[law].stiffness;
+    rate = m_rate.plastic.empty()
+               ? 0.0
+               : m_rate.plastic[row] + (spring > 0.0 ? m_rate.force[row] / spring : 0.0);
+    return m_plastic[row] + (spring > 0.0 ? m_force[row] / spring : 0.0);
+}
+
+std::vector<T_HINGE_STATE> CPushPath::HingeStates() const
+{
+    std::vector<std::vector<std::array<int, 2>>> vertex(m_model.hinges.size());
+    for (std::size_t h = 0; h < vertex.size(); ++h)
+        vertex[h].resize(m_model.hinges[h].laws.size());
+    for (std::size_t f = 0; f < m_flows.flows.size(); ++f) {
+        const CPushFlow& flow = m_flows.flows[f];
+        int& most = vertex[flow.hinge][flow.law][flow.positive ? 0 : 1];
+        most = std::max(most, Backbone(f).Vertex());
+    }
+    std::vector<T_HINGE_STATE> out;
+    double rate = 0.0;
+    for (std::size_t h = 0; h < vertex.size(); ++h)
+        for (std::size_t l = 0; l < vertex[h].size(); ++l) {
+            T_HINGE_STATE& state = out.emplace_back();
+            state.deformation = Deformation(h, l, rate);
+            state.force = m_force[m_structure.RowOf(h, l)];
+            const auto [positive, negative] = vertex[h][l];
+            const bool isPositive = negative == 0 || (positive > 0 && state.force >= 0.0);
+            state.place = isPositive ? positive : -negative;
+        }
+    return out;
+}
+
+} // namespace solver

@@ -1,0 +1,163 @@
+// The path of a push in the space of its hinges, from event to event.
+#pragma once
+
+#include "qm_solver/push/flowsystem.h"
+#include "qm_solver/push/pushflow.h"
+
+#include <map>
+#include <tuple>
+#include <utility>
+
+namespace solver {
+
+/// Rates along the path.
+struct T_PUSH_RATE {
+    double factor = 0.0;         // of the load factor
+    double control = 0.0;        // of the control displacement
+    std::vector<double> flow;    // by active flow
+    std::vector<double> plastic; // by row
+    std::vector<double> force;   // by row
+};
+
+/// What the direction of the path is told from: the change that the last event has begun goes on.
+struct T_PUSH_DRIVE {
+    enum class KIND { Control, Factor, Before, Flows, Forces };
+    KIND kind = KIND::Control;
+    double sign = 1.0;              // of control or factor
+    std::vector<std::size_t> flows; // that go on, or whose force grows (sign -1: falls)
+};
+
+/// A functional of the state that the run watches.
+struct T_WATCH {
+    T_PROBE probe;
+    double value = 0.0, rate = 0.0;
+    std::vector<double> byLoads; // by set of loads: of the elastic answer
+};
+
+/// Forces s, plastic deformations q, load factor, and the state of every flow; the conditions of
+/// the flows that are active form the small system. Columns of the structure are asked for when a
+/// row begins to flow, with those of the rows that are next.
+class CPushPath {
+public:
+    /// Rates below this part of the largest one, both by strengths, count as none.
+    static constexpr double kLeastRate = 1e-9;
+    using T_FAULT = std::optional<T_SOLVER_ERROR>;
+
+    CPushPath(const T_PUSH_MODEL& model, CPushStructure& structure);
+
+    /// Functionals that are watched; before the first stage.
+    std::size_t Watch(T_PROBE probe);
+    double Watched(std::size_t w) const { return m_watches[w].value; }
+    double WatchRate(std::size_t w) const { return m_watches[w].rate; }
+
+    /// The set of loads that grows from here on, the sets before it standing as they are.
+    /// control: watch number of the control displacement; none: controlled by the load factor.
+    T_FAULT BeginStage(std::size_t set, std::optional<std::size_t> control);
+    /// Answers of the structure anew, after another factorisation; the state stays.
+    T_FAULT Renew();
+
+    /// Finds who flows next and the rates. 1 done; 0 there is no way on.
+    enum class WAY { On, None, Fault };
+    WAY Select(T_FAULT& fault);
+    void SetDrive(T_PUSH_DRIVE drive) { m_drive = std::move(drive); }
+    const T_PUSH_RATE& Rate() const { return m_rate; }
+
+    /// Parameter to the next event along the rates; infinite without one.
+    double NextEvent() const;
+    void Advance(double by);
+    /// Turns what has come to its event; the hinges that have turned are in Turned. -1, or the
+    /// hinge whose axial force has left its line of strength.
+    long Turn();
+    std::vector<T_HINGE_EVENT> TakeTurned();
+    /// Brings the forces back onto the yield conditions, the control displacement at `control`
+    /// (none: the load factor as it is), and sums them up anew.
+    T_FAULT Correct(std::optional<double> control);
+
+    double Factor() const { return m_factors.back(); }
+    const std::vector<double>& Factors() const { return m_factors; }
+    const std::vector<double>& Plastic() const { return m_plastic; }
+    T_PUSH_STATE State() const { return {m_factors, m_plastic}; }
+    std::vector<T_HINGE_STATE> HingeStates() const;
+    /// Plastic and elastic part of the deformation of a law, and its rate.
+    double Deformation(std::size_t hinge, std::size_t law, double& rate) const;
+    const T_PUSH_FLOWS& Flows() const { return m_flows; }
+    /// The loads grow along the rates: by more than this part of what flows and what forces change.
+    bool LoadGrows(double part) const;
+    /// Conditions hang on the axial force in more than a straight way: steps need Correct.
+    bool IsCurved() const { return m_isCurved; }
+
+private:
+    struct T_COLUMN {
+        std::vector<double> force; // by row
+        std::vector<double> watch;
+    };
+
+    // pushselection.cpp
+    T_FAULT Fetch(std::span<const std::size_t> rows);
+    std::vector<std::size_t> MissingRows(std::span<const std::size_t> flows);
+    T_FAULT Activate(std::size_t flow);
+    void Deactivate(std::size_t flow);
+    int MakeRates();
+    int SolveDirection(std::vector<double>& x);
+    double DriveSign() const;
+    void RatesOf(std::span<const double> x, double sign);
+    double Norm() const;
+    struct T_CHANGE {
+        std::size_t flow;
+        double amount;
+        enum class KIND { Unload, Start, StartBack, End, EndBack, Part } kind;
+    };
+    std::vector<T_CHANGE> Violations();
+    void ChoosePart(std::size_t flow);
+    void Touch(std::size_t flow);
+    T_FAULT Apply(const T_CHANGE& change);
+    T_FAULT Sync(std::size_t flow);
+    T_FAULT SyncTouched();
+    void NoteTurns();
+
+    CHingeBackbone& Backbone(std::size_t flow)
+    {
+        return m_flows.backbones[m_flows.flows[flow].backbone];
+    }
+    const CHingeBackbone& Backbone(std::size_t flow) const
+    {
+        return m_flows.backbones[m_flows.flows[flow].backbone];
+    }
+    // pushpath.cpp
+    T_FAULT Rebuild();
+    void SumUp();
+    void TakeDrive(std::span<const std::size_t> begun);
+    double Least() const { return kLeastRate * Norm(); }
+
+    double Resistance(std::size_t flow) const;
+    double Phi(std::size_t flow, double resistance) const;
+    double PhiRate(std::size_t flow) const;
+    double Tolerance(std::size_t flow) const;
+    bool IsActive(std::size_t flow) const { return m_place[flow] > 0; }
+
+    const T_PUSH_MODEL& m_model;
+    CPushStructure& m_structure;
+    T_PUSH_FLOWS m_flows;
+    CFlowSystem m_system;
+    std::vector<std::size_t> m_active; // flows; unknown k of the system is entry k - 1
+    std::vector<std::size_t> m_place;  // by flow: its unknown, 0 none
+    std::map<std::size_t, T_COLUMN> m_columns;
+    std::vector<const T_COLUMN*> m_columnOf; // by row
+    std::vector<T_WATCH> m_watches;
+    std::vector<double> m_factors; // by set of loads
+    std::vector<double> m_force, m_plastic;
+    std::optional<std::size_t> m_control;
+    T_PUSH_RATE m_rate;
+    std::vector<double> m_before; // forces' rates of the last way
+    T_PUSH_DRIVE m_drive;
+    struct T_WAS {
+        CHingeBackbone::ON on;
+        int vertex;
+    };
+    std::map<std::size_t, T_WAS> m_touched; // flows that change at this event
+    std::vector<T_HINGE_EVENT> m_turned;
+    bool m_isCurved = false;
+    int m_border = 0; // which row borders the system: 0 control, 1 load factor, 2 flows
+};
+
+} // namespace solver

@@ -1,0 +1,457 @@
+#include "qm_solver/push/pushrun.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace solver {
+
+namespace {
+
+constexpr std::size_t kStepBlock = 16; // stored steps that are solved together
+constexpr double kOnTarget = 1e-12;    // of the way to the target
+constexpr double kBalanced = 1e-8;     // residual of a stored step
+constexpr double kTensionKept = 1e-10; // of the largest axial force: P-Delta is up to date
+constexpr int kMostUpdates = 30;
+constexpr double kMechanism = 1e-9; // rate of the loads against what flows
+
+bool IsEmpty(const T_LOAD_CASE& loads)
+{
+    return loads.selfWeight == T_VEC3{} && loads.nodal.empty() && loads.beam.empty() &&
+           loads.settlement.empty() && loads.temperature.empty() && loads.pretension.empty();
+}
+
+bool Differ(std::span<const double> a, std::span<const double> b)
+{
+    double most = 0.0, apart = 0.0;
+    for (std::size_t i = 0; i < a.size(); ++i) {
+        most = std::max(most, std::fabs(a[i]));
+        apart = std::max(apart, std::fabs(a[i] - (b.empty() ? 0.0 : b[i])));
+    }
+    return apart > kTensionKept * most;
+}
+
+T_PUSH_STAGE InitialStage(const T_PUSH_MODEL& model)
+{
+    T_PUSH_STAGE stage;
+    stage.loads = model.initial;
+    stage.control = PUSH_CONTROL::LoadFactor;
+    stage.target = 1.0;
+    return stage;
+}
+
+} // namespace
+
+CPushRun::T_FAULT CPushRun::Go(std::span<const T_PUSH_STAGE> stages, T_PUSH_END& end)
+{
+    end = {};
+    bool goesOn = true;
+    m_structure.DropLoads();
+    if (auto fault = Initial(end, goesOn)) return fault;
+    for (std::size_t s = 0; s < stages.size() && goesOn; ++s)
+        if (auto fault = Stage(stages[s], s, end, goesOn)) return fault;
+    return {};
+}
+
+/// With P-Delta the axial forces at the end of the initial loads make the couples of all of them.
+CPushRun::T_FAULT CPushRun::Initial(T_PUSH_END& end, bool& goesOn)
+{
+    if (auto fault = m_structure.Factorise({})) return fault;
+    m_path = std::make_unique<CPushPath>(m_model, m_structure);
+    if (IsEmpty(m_model.initial)) return {};
+    if (auto fault = m_structure.AddLoads(m_model.initial, 0)) return fault;
+    if (auto fault = m_structure.SolveLoads()) return fault;
+    if (auto fault = InitialPath(end, goesOn)) return fault;
+    std::vector<double> tension;
+    for (int tries = 0; m_model.pDelta != P_DELTA::None && goesOn && tries < kMostUpdates;
+         ++tries) {
+        const T_PUSH_STATE state = m_path->State();
+        T_PUSH_STEP step;
+        if (auto fault = m_structure.Displace({&state, 1}, {&step, 1})) return fault;
+        std::vector<double> now = m_structure.Tensions(state, step.nodes);
+        if (!Differ(now, tension)) break;
+        tension = now;
+        if (auto fault = m_structure.Factorise(std::move(now))) return fault;
+        if (auto fault = m_structure.SolveLoads()) return fault;
+        if (auto fault = InitialPath(end, goesOn)) return fault;
+    }
+    for (const T_PUSH_EVENT& event : m_events)
+        if (m_sink.event) m_sink.event(event);
+    m_events.clear();
+    return {};
+}
+
+CPushRun::T_FAULT CPushRun::InitialPath(T_PUSH_END& end, bool& goesOn)
+{
+    m_events.clear();
+    m_eventCount = 0;
+    m_path = std::make_unique<CPushPath>(m_model, m_structure);
+    m_nodeWatch.clear();
+    m_driftWatch.clear();
+    const T_PUSH_STAGE stage = InitialStage(m_model);
+    if (auto fault = m_path->BeginStage(0, std::nullopt)) return fault;
+    MakeTargets(stage);
+    if (auto fault = Follow(stage, -1, end)) return fault;
+    goesOn = end.outcome == PUSH_OUTCOME::Reached;
+    if (end.outcome == PUSH_OUTCOME::NoEquilibrium || end.outcome == PUSH_OUTCOME::NoPath)
+        end.outcome = PUSH_OUTCOME::InitialLoads;
+    return {};
+}
+
+CPushRun::T_FAULT CPushRun::Stage(const T_PUSH_STAGE& stage, std::size_t number, T_PUSH_END& end,
+                                  bool& goesOn)
+{
+    const std::size_t set = m_structure.LoadCount();
+    if (auto fault = m_structure.AddLoads(stage.loads, number)) return fault;
+    if (auto fault = m_structure.SolveLoads()) return fault;
+    m_nodeWatch.clear();
+    m_driftWatch.clear();
+    const auto direction = static_cast<std::size_t>(stage.direction);
+    const auto watch = [&](std::size_t node) {
+        return m_path->Watch(m_structure.Displacement(node, direction));
+    };
+    if (stage.control == PUSH_CONTROL::LargestTranslation)
+        for (std::size_t n = 0; n < m_model.frame.nodes.size(); ++n)
+            m_nodeWatch.push_back(watch(n));
+    else
+        m_nodeWatch.push_back(watch(stage.node));
+    for (const T_PUSH_DRIFT& drift : m_model.drifts) {
+        const std::size_t top = watch(drift.node);
+        m_driftWatch.push_back({top, drift.below == T_PUSH_DRIFT::kGround ? T_PUSH_DRIFT::kGround
+                                                                          : watch(drift.below)});
+    }
+    std::optional<std::size_t> control;
+    if (stage.control != PUSH_CONTROL::LoadFactor) {
+        double most = -1.0; // the node that moves most at first
+        const std::vector<double>& unknowns = m_structure.Loads(set).unknowns;
+        for (std::size_t w = 0; w < m_nodeWatch.size(); ++w) {
+            const std::size_t node = m_nodeWatch.size() == 1 ? stage.node : w;
+            const double moved =
+                std::fabs(m_structure.Value(m_structure.Displacement(node, direction), unknowns));
+            if (moved > most) control = m_nodeWatch[w];
+            most = std::max(most, moved);
+        }
+    }
+    if (auto fault = m_path->BeginStage(set, control)) return fault;
+    MakeTargets(stage);
+    if (auto fault = Follow(stage, static_cast<int>(number), end)) return fault;
+    end.stage = number;
+    goesOn = end.outcome == PUSH_OUTCOME::Reached;
+    return {};
+}
+
+double CPushRun::Present(const T_PUSH_STAGE& stage) const
+{
+    if (stage.control == PUSH_CONTROL::LoadFactor) return m_path->Factor();
+    double most = m_path->Watched(m_nodeWatch[0]);
+    for (const std::size_t w : m_nodeWatch)
+        if (m_sign * m_path->Watched(w) > m_sign * most) most = m_path->Watched(w);
+    return most;
+}
+
+void CPushRun::MakeTargets(const T_PUSH_STAGE& stage)
+{
+    const bool byLoad = stage.control == PUSH_CONTROL::LoadFactor;
+    m_sign = byLoad || stage.target >= 0.0 ? 1.0 : -1.0;
+    m_start = Present(stage);
+    if (!byLoad && stage.target < m_start) m_sign = -1.0;
+    m_peak = {};
+    m_targets.clear();
+    m_target = 0;
+    const double way = stage.target - m_start;
+    for (const double fraction : stage.steps)
+        m_targets.push_back({fraction == 1.0 ? stage.target : m_start + fraction * way, false});
+    if (m_targets.empty()) m_targets.push_back({stage.target, false});
+    for (const double value : stage.additional)
+        m_targets.push_back({value, true});
+    const auto before = [&](const T_TARGET& a, const T_TARGET& b) {
+        return m_sign * a.value < m_sign * b.value;
+    };
+    std::stable_sort(m_targets.begin(), m_targets.end(), before);
+    const double same = kOnTarget * std::fabs(way);
+    std::vector<T_TARGET> apart;
+    for (const T_TARGET& t : m_targets) {
+        if (m_sign * (t.value - m_start) <= same || m_sign * (t.value - stage.target) > same)
+            continue; // behind the start, beyond the end
+        if (!apart.empty() && std::fabs(t.value - apart.back().value) <= same)
+            apart.back().additional |= t.additional;
+        else
+            apart.push_back(t);
+    }
+    m_targets = std::move(apart);
+}
+
+/// Along the rates, to the next stored step; infinite where the path leads away from it.
+double CPushRun::ToTarget(const T_PUSH_STAGE& stage) const
+{
+    const double target = m_targets[m_target].value;
+    double first = CHingeBackbone::kFar;
+    const auto take = [&](double value, double rate) {
+        if (m_sign * rate > 0.0)
+            first = std::min(first, std::max(0.0, m_sign * (target - value)) / (m_sign * rate));
+    };
+    if (stage.control == PUSH_CONTROL::LoadFactor)
+        take(m_path->Factor(), m_path->Rate().factor);
+    else
+        for (const std::size_t w : m_nodeWatch)
+            take(m_path->Watched(w), m_path->WatchRate(w));
+    return first;
+}
+
+double CPushRun::Reaction(const T_PUSH_STAGE& stage) const
+{
+    return -Base()[static_cast<std::size_t>(stage.direction)];
+}
+
+double CPushRun::ReactionRate(const T_PUSH_STAGE& stage) const
+{
+    return m_path->Rate().factor * m_structure.Loads(m_structure.LoadCount() - 1)
+                                       .sum[static_cast<std::size_t>(stage.direction)];
+}
+
+/// What the supports give, from the loads.
+T_VEC6 CPushRun::Base() const
+{
+    T_VEC6 base{};
+    for (std::size_t l = 0; l < m_path->Factors().size(); ++l)
+        for (std::size_t d = 0; d < 6; ++d)
+            base[d] -= m_path->Factors()[l] * m_structure.Loads(l).sum[d];
+    return base;
+}
+
+/// Along the rates, to the first of the stops that were asked for; `end` is filled for it.
+double CPushRun::ToStop(const T_PUSH_STAGE& stage, T_PUSH_END& end) const
+{
+    double first = CHingeBackbone::kFar;
+    const auto take = [&](double distance, double rate, PUSH_OUTCOME outcome, long hinge,
+                          long drift) {
+        if (!(rate > 0.0) || distance / rate >= first) return;
+        first = std::max(0.0, distance) / rate;
+        end.outcome = outcome;
+        end.hinge = hinge;
+        end.drift = drift;
+    };
+    const T_PUSH_STOPS& stops = stage.stops;
+    for (std::size_t d = 0; d < m_driftWatch.size() && stops.drift > 0.0; ++d) {
+        const auto [top, below] = m_driftWatch[d];
+        const bool onGround = below == T_PUSH_DRIFT::kGround;
+        const double height = m_model.drifts[d].height;
+        const double drift =
+            (m_path->Watched(top) - (onGround ? 0.0 : m_path->Watched(below))) / height;
+        const double rate =
+            (m_path->WatchRate(top) - (onGround ? 0.0 : m_path->WatchRate(below))) / height;
+        for (const double sign : {1.0, -1.0})
+            take(stops.drift - sign * drift, sign * rate, PUSH_OUTCOME::DriftStop, -1,
+                 static_cast<long>(d));
+    }
+    for (std::size_t h = 0; h < m_model.hinges.size() && stops.mark >= 0; ++h)
+        for (std::size_t l = 0; l < m_model.hinges[h].laws.size(); ++l) {
+            const T_HINGE_LAW& law = m_model.hinges[h].laws[l];
+            double rate = 0.0;
+            const double deformation = m_path->Deformation(h, l, rate);
+            for (const double sign : {1.0, -1.0}) {
+                const auto& marks = (sign > 0.0 ? law.positive : law.negative).marks;
+                if (marks.size() > static_cast<std::size_t>(stops.mark))
+                    take(marks[static_cast<std::size_t>(stops.mark)] - sign * deformation,
+                         sign * rate, PUSH_OUTCOME::MarkStop, static_cast<long>(h), -1);
+            }
+        }
+    if (stops.fractionOfPeak > 0.0 && m_peak.reaction > 0.0) {
+        const double sign = m_sign;
+        take(sign * Reaction(stage) - stops.fractionOfPeak * m_peak.reaction,
+             -sign * ReactionRate(stage), PUSH_OUTCOME::PeakFractionStop, -1, -1);
+    }
+    return first;
+}
+
+/// Stops that a change of direction brings, and those of hinges that have just turned.
+bool CPushRun::StopsHere(const T_PUSH_STAGE& stage, T_PUSH_END& end)
+{
+    m_peak.reaction = std::max(m_peak.reaction, m_sign * Reaction(stage));
+    const T_PUSH_STOPS& stops = stage.stops;
+    const double moved = m_path->WatchRate(m_nodeWatch[0]);
+    if (moved != 0.0) {
+        const double tangent = ReactionRate(stage) / moved;
+        if (m_peak.first == 0.0) m_peak.first = tangent;
+        if (stops.stiffnessRatio > 0.0 && tangent <= stops.stiffnessRatio * m_peak.first) {
+            end.outcome = PUSH_OUTCOME::StiffnessStop;
+            return true;
+        }
+    }
+    if (!stops.strengthLoss && !stops.lastPoint) return false;
+    for (const CPushFlow& flow : m_path->Flows().flows) {
+        const CHingeBackbone& backbone = m_path->Flows().backbones[flow.backbone];
+        const bool lost = stops.strengthLoss && backbone.LosesStrength();
+        const bool beyond = stops.lastPoint && backbone.VertexCount() > 1 &&
+                            backbone.Vertex() >= backbone.VertexCount();
+        if (!lost && !beyond) continue;
+        end.outcome = lost ? PUSH_OUTCOME::StrengthLossStop : PUSH_OUTCOME::LastPointStop;
+        end.hinge = static_cast<long>(flow.hinge);
+        return true;
+    }
+    return false;
+}
+
+void CPushRun::NoteEvent(const T_PUSH_STAGE& stage, int number)
+{
+    T_PUSH_EVENT event;
+    event.hinges = m_path->TakeTurned();
+    if (event.hinges.empty()) return;
+    event.stage = number;
+    event.loadFactor = m_path->Factor();
+    event.displacement = m_nodeWatch.empty() ? 0.0 : Present(stage);
+    if (stage.control == PUSH_CONTROL::LoadFactor && !m_nodeWatch.empty())
+        event.displacement = m_path->Watched(m_nodeWatch[0]);
+    event.base = Base();
+    if (number < 0)
+        m_events.push_back(std::move(event));
+    else if (m_sink.event)
+        m_sink.event(event);
+}
+
+/// P-Delta with the axial forces of this step: factorised again until they are those of the factor.
+CPushRun::T_FAULT CPushRun::Update(const T_PUSH_STAGE&, std::optional<double> control)
+{
+    std::vector<double> before;
+    for (int tries = 0; tries < kMostUpdates; ++tries) {
+        const T_PUSH_STATE state = m_path->State();
+        T_PUSH_STEP step;
+        if (auto fault = m_structure.Displace({&state, 1}, {&step, 1})) return fault;
+        std::vector<double> now = m_structure.Tensions(state, step.nodes);
+        if (!Differ(now, m_structure.Tension())) break;
+        if (auto fault = m_structure.Factorise(std::move(now))) return fault;
+        if (auto fault = m_structure.SolveLoads()) return fault;
+        if (auto fault = m_path->Renew()) return fault;
+        if (auto fault = m_path->Correct(control)) return fault;
+    }
+    return {};
+}
+
+CPushRun::T_FAULT CPushRun::Store(const T_PUSH_STAGE& stage, int number, bool additional,
+                                  T_PUSH_END& end)
+{
+    if (number < 0) return {};
+    T_PUSH_STEP& step = m_steps.emplace_back();
+    step.stage = static_cast<std::size_t>(number);
+    step.loadFactor = m_path->Factor();
+    step.displacement = stage.control == PUSH_CONTROL::LoadFactor ? m_path->Watched(m_nodeWatch[0])
+                                                                  : Present(stage);
+    step.additional = additional;
+    step.hinges = m_path->HingeStates();
+    m_states.push_back(m_path->State());
+    end.loadFactor = step.loadFactor;
+    end.displacement = step.displacement;
+    return m_steps.size() >= kStepBlock || IsUpdated() ? Flush(end) : T_FAULT{};
+}
+
+/// Displacements of the steps that wait, checked, and handed on. A step that is out of balance is
+/// solved once more with a fresh factor; then the run ends before it.
+CPushRun::T_FAULT CPushRun::Flush(T_PUSH_END& end)
+{
+    if (m_steps.empty()) return {};
+    if (auto fault = m_structure.Displace(m_states, m_steps)) return fault;
+    for (std::size_t s = 0; s < m_steps.size() && !m_cancelled; ++s) {
+        if (m_steps[s].residual > kBalanced) {
+            if (auto fault = m_structure.Refactorise()) return fault;
+            if (auto fault = m_structure.Displace({&m_states[s], 1}, {&m_steps[s], 1}))
+                return fault;
+        }
+        if (m_steps[s].residual > kBalanced) {
+            end.outcome = PUSH_OUTCOME::OutOfBalance;
+            m_cancelled = true;
+            break;
+        }
+        const std::vector<double> tension = m_structure.Tensions(m_states[s], m_steps[s].nodes);
+        for (const T_PUSH_HINGE& hinge : m_model.hinges)
+            m_steps[s].axial.push_back(tension[hinge.element]);
+        m_kept.push_back(
+            {m_steps[s].stage, m_steps[s].loadFactor, m_steps[s].displacement, m_states[s]});
+        if (m_sink.step && !m_sink.step(m_steps[s])) {
+            end.outcome = PUSH_OUTCOME::Cancelled;
+            m_cancelled = true;
+        }
+    }
+    m_steps.clear();
+    m_states.clear();
+    return {};
+}
+
+CPushRun::T_FAULT CPushRun::Follow(const T_PUSH_STAGE& stage, int number, T_PUSH_END& end)
+{
+    const bool byLoad = stage.control == PUSH_CONTROL::LoadFactor;
+    const auto finish = [&](PUSH_OUTCOME outcome) -> T_FAULT {
+        end.outcome = outcome;
+        end.loadFactor = m_path->Factor();
+        if (!m_nodeWatch.empty())
+            end.displacement = byLoad ? m_path->Watched(m_nodeWatch[0]) : Present(stage);
+        return Flush(end);
+    };
+    const auto drive = [&] {
+        return T_PUSH_DRIVE{
+            byLoad ? T_PUSH_DRIVE::KIND::Factor : T_PUSH_DRIVE::KIND::Control, m_sign, {}};
+    };
+    m_path->SetDrive(drive());
+    const double way = std::fabs(stage.target - m_start);
+    while (m_target < m_targets.size()) {
+        T_FAULT fault;
+        const CPushPath::WAY found = m_path->Select(fault);
+        if (found == CPushPath::WAY::Fault) return fault;
+        NoteEvent(stage, number);
+        if (found == CPushPath::WAY::None || (byLoad && !m_path->LoadGrows(kMechanism)))
+            return finish(byLoad ? PUSH_OUTCOME::NoEquilibrium : PUSH_OUTCOME::NoPath);
+        if (number >= 0 && StopsHere(stage, end)) {
+            if (m_path->Factor() != 0.0 && (fault = Store(stage, number, false, end))) return fault;
+            return finish(end.outcome);
+        }
+        T_PUSH_END stop;
+        const double toEvent = m_path->NextEvent(), toTarget = ToTarget(stage),
+                     toStop = number < 0 ? CHingeBackbone::kFar : ToStop(stage, stop);
+        const double by = std::min({toEvent, toTarget, toStop});
+        if (!(by < CHingeBackbone::kFar)) return finish(PUSH_OUTCOME::NoPath);
+        m_path->Advance(by);
+        if (toTarget <= by || toStop <= by) {
+            const bool onTarget = toTarget <= by;
+            const std::optional<double> control =
+                onTarget && !byLoad ? std::optional(m_targets[m_target].value) : std::nullopt;
+            if ((fault = m_path->Correct(control))) return fault;
+            if (IsUpdated() && number >= 0 && (fault = Update(stage, control))) return fault;
+            if ((fault = Store(stage, number, onTarget && m_targets[m_target].additional, end)))
+                return fault;
+            if (m_cancelled) return finish(end.outcome);
+            if (!onTarget) {
+                end.hinge = stop.hinge;
+                end.drift = stop.drift;
+                return finish(stop.outcome);
+            }
+            ++m_target;
+        } else if (m_path->IsCurved() && (fault = m_path->Correct(std::nullopt))) {
+            return fault;
+        }
+        if (toEvent <= by) {
+            if (++m_eventCount > m_model.mostEvents) return finish(PUSH_OUTCOME::TooManyEvents);
+            ++m_structure.Cost().events;
+            const long outside = m_path->Turn();
+            if (byLoad) m_path->SetDrive(drive());
+            if (outside >= 0) {
+                end.hinge = outside;
+                return finish(PUSH_OUTCOME::AxialStrength);
+            }
+        } else {
+            m_path->SetDrive({T_PUSH_DRIVE::KIND::Before, 1.0, {}});
+            if (byLoad) m_path->SetDrive(drive());
+        }
+        if (!byLoad && m_sign * (Present(stage) - m_start) < -1e-6 * way)
+            return finish(PUSH_OUTCOME::SnapBack);
+    }
+    return finish(PUSH_OUTCOME::Reached);
+}
+
+const T_PUSH_STATE* CPushRun::StateOf(const T_PUSH_STEP& step) const
+{
+    for (const T_KEPT& kept : m_kept)
+        if (kept.stage == step.stage && kept.loadFactor == step.loadFactor &&
+            kept.displacement == step.displacement)
+            return &kept.state;
+    return nullptr;
+}
+
+} // namespace solver

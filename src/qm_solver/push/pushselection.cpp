@@ -1,0 +1,386 @@
+// Who flows: the active flows of a push, their rates, and their changes at an event.
+#include "qm_solver/push/pushpath.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace solver {
+
+namespace {
+
+constexpr double kAtLimit = 1e-10; // of the strength: a force that has reached its limit
+constexpr int kTogether = 12;      // rounds in which all that must change does so at once
+constexpr int kMostRounds = 400;   // then one at a time
+constexpr std::size_t kBlock = 16; // columns solved together
+
+using ON = CHingeBackbone::ON;
+
+bool IsMoving(ON on)
+{
+    return on == ON::Virgin || on == ON::Back;
+}
+
+} // namespace
+
+double CPushPath::Tolerance(std::size_t flow) const
+{
+    return kAtLimit * m_flows.flows[flow].force;
+}
+
+double CPushPath::Phi(std::size_t f, double resistance) const
+{
+    const CPushFlow& flow = m_flows.flows[f];
+    return flow.Value(m_force) - flow.Scale(m_force) * resistance;
+}
+
+double CPushPath::Resistance(std::size_t f) const
+{
+    return m_flows.backbones[m_flows.flows[f].backbone].Force();
+}
+
+/// Of the condition with its resistance held.
+double CPushPath::PhiRate(std::size_t f) const
+{
+    const CPushFlow& flow = m_flows.flows[f];
+    double rate = 0.0;
+    for (const T_FLOW_TERM& t : flow.Gradient(m_force, Resistance(f)))
+        rate += t.factor * m_rate.force[t.row];
+    return rate;
+}
+
+CPushPath::T_FAULT CPushPath::Fetch(std::span<const std::size_t> rows)
+{
+    std::vector<T_PROBE> probes;
+    for (const T_WATCH& w : m_watches)
+        probes.push_back(w.probe);
+    std::vector<double> forces, values;
+    if (auto fault = m_structure.Columns(rows, probes, forces, values)) return fault;
+    const std::size_t count = m_structure.RowCount();
+    for (std::size_t c = 0; c < rows.size(); ++c) {
+        T_COLUMN& column = m_columns[rows[c]];
+        column.force.assign(forces.begin() + static_cast<long>(c * count),
+                            forces.begin() + static_cast<long>((c + 1) * count));
+        column.watch.assign(values.begin() + static_cast<long>(c * probes.size()),
+                            values.begin() + static_cast<long>((c + 1) * probes.size()));
+        m_columnOf[rows[c]] = &column;
+    }
+    return {};
+}
+
+/// Rows of these flows without a column, and of those that are next to flow as the path goes now.
+std::vector<std::size_t> CPushPath::MissingRows(std::span<const std::size_t> flows)
+{
+    std::vector<std::size_t> rows;
+    const auto take = [&](std::size_t f) {
+        for (const T_FLOW_TERM& t : m_flows.flows[f].Direction(m_force, Resistance(f)))
+            if (!m_columnOf[t.row] && std::find(rows.begin(), rows.end(), t.row) == rows.end())
+                rows.push_back(t.row);
+    };
+    for (const std::size_t f : flows)
+        take(f);
+    if (rows.empty() || m_rate.force.empty()) return rows;
+    std::vector<std::pair<double, std::size_t>> next;
+    for (std::size_t f = 0; f < m_flows.flows.size(); ++f) {
+        const CPushFlow& flow = m_flows.flows[f];
+        const CHingeBackbone& backbone = m_flows.backbones[flow.backbone];
+        if (backbone.On() != ON::Locked || m_columnOf[flow.Rows()[0]]) continue;
+        const double rate = PhiRate(f);
+        if (rate > 0.0) next.emplace_back(-Phi(f, backbone.Upper()) / rate, f);
+    }
+    std::sort(next.begin(), next.end());
+    for (std::size_t k = 0; k < next.size() && rows.size() < kBlock; ++k)
+        take(next[k].second);
+    return rows;
+}
+
+CPushPath::T_FAULT CPushPath::Activate(std::size_t f)
+{
+    const std::size_t one[] = {f};
+    if (const auto rows = MissingRows(one); !rows.empty())
+        if (auto fault = Fetch(rows)) return fault;
+    const CPushFlow& flow = m_flows.flows[f];
+    const CHingeBackbone& backbone = m_flows.backbones[flow.backbone];
+    const double resistance = backbone.Force();
+    const auto gradient = flow.Gradient(m_force, resistance);
+    const auto direction = flow.Direction(m_force, resistance);
+    const std::vector<double>& loads = m_structure.Loads(m_factors.size() - 1).force;
+    std::vector<double> row(m_system.Size()), column(m_system.Size());
+    for (const T_FLOW_TERM& g : gradient)
+        row[0] -= g.factor * loads[g.row];
+    if (m_border == 0 && m_control)
+        for (const T_FLOW_TERM& d : direction)
+            column[0] += d.factor * m_columnOf[d.row]->watch[*m_control];
+    if (m_border == 2) column[0] = flow.force;
+    for (std::size_t k = 0; k < m_active.size(); ++k) {
+        CPushFlow& other = m_flows.flows[m_active[k]];
+        const double theirs = Resistance(m_active[k]);
+        for (const T_FLOW_TERM& g : gradient)
+            for (const T_FLOW_TERM& d : other.Direction(m_force, theirs))
+                row[k + 1] -= g.factor * d.factor * m_columnOf[d.row]->force[g.row];
+        for (const T_FLOW_TERM& g : other.Gradient(m_force, theirs))
+            for (const T_FLOW_TERM& d : direction)
+                column[k + 1] -= g.factor * d.factor * m_columnOf[d.row]->force[g.row];
+    }
+    double diagonal = flow.Scale(m_force) * backbone.Slope();
+    for (const T_FLOW_TERM& g : gradient)
+        for (const T_FLOW_TERM& d : direction)
+            diagonal -= g.factor * d.factor * m_columnOf[d.row]->force[g.row];
+    m_system.Add(row, column, diagonal);
+    m_active.push_back(f);
+    m_place[f] = m_active.size();
+    return {};
+}
+
+void CPushPath::Deactivate(std::size_t f)
+{
+    const std::size_t at = m_place[f];
+    m_system.Remove(at);
+    m_active.erase(m_active.begin() + static_cast<long>(at - 1));
+    m_place[f] = 0;
+    for (std::size_t k = at - 1; k < m_active.size(); ++k)
+        m_place[m_active[k]] = k + 1;
+}
+
+/// The flow's place in the system as its backbone is now.
+CPushPath::T_FAULT CPushPath::Sync(std::size_t f)
+{
+    if (IsActive(f)) Deactivate(f);
+    if (!IsMoving(m_flows.backbones[m_flows.flows[f].backbone].On())) return {};
+    return Activate(f);
+}
+
+int CPushPath::SolveDirection(std::vector<double>& x)
+{
+    std::vector<double> right(m_system.Size(), 0.0);
+    right[0] = 1.0;
+    if (m_system.Solve(right, x)) return 1;
+    // The control does not move along the path, or the load factor alone does not: another border.
+    for (const int border : {0, 1, 2}) {
+        if (border == m_border || (border == 0 && !m_control)) continue;
+        m_border = border;
+        std::vector<double> row(m_system.Size(), 0.0);
+        const std::size_t set = m_factors.size() - 1;
+        if (border == 0) row[0] = m_watches[*m_control].byLoads[set];
+        if (border == 1) row[0] = 1.0;
+        for (std::size_t k = 0; k < m_active.size(); ++k) {
+            CPushFlow& flow = m_flows.flows[m_active[k]];
+            if (border == 2) row[k + 1] = flow.force;
+            if (border == 0)
+                for (const T_FLOW_TERM& d : flow.Direction(m_force, Resistance(m_active[k])))
+                    row[k + 1] += d.factor * m_columnOf[d.row]->watch[*m_control];
+        }
+        m_system.SetControl(row);
+        if (m_system.Solve(right, x)) return 1;
+    }
+    return 0;
+}
+
+void CPushPath::RatesOf(std::span<const double> x, double sign)
+{
+    const std::size_t rows = m_structure.RowCount(), set = m_factors.size() - 1;
+    m_rate.factor = sign * x[0];
+    m_rate.flow.resize(m_active.size());
+    m_rate.plastic.assign(rows, 0.0);
+    for (std::size_t k = 0; k < m_active.size(); ++k) {
+        m_rate.flow[k] = sign * x[k + 1];
+        CPushFlow& flow = m_flows.flows[m_active[k]];
+        for (const T_FLOW_TERM& d : flow.Direction(m_force, Resistance(m_active[k])))
+            m_rate.plastic[d.row] += d.factor * m_rate.flow[k];
+    }
+    const std::vector<double>& loads = m_structure.Loads(set).force;
+    m_rate.force.resize(rows);
+    for (std::size_t r = 0; r < rows; ++r)
+        m_rate.force[r] = m_rate.factor * loads[r];
+    for (T_WATCH& w : m_watches)
+        w.rate = m_rate.factor * w.byLoads[set];
+    for (std::size_t c = 0; c < rows; ++c) {
+        const double q = m_rate.plastic[c];
+        if (q == 0.0) continue;
+        const double* column = m_columnOf[c]->force.data();
+        for (std::size_t r = 0; r < rows; ++r)
+            m_rate.force[r] += q * column[r];
+        for (std::size_t w = 0; w < m_watches.size(); ++w)
+            m_watches[w].rate += q * m_columnOf[c]->watch[w];
+    }
+    m_rate.control = m_control ? m_watches[*m_control].rate : m_rate.factor;
+}
+
+/// Rates by strengths: of forces, and of what flows as the force that it would make elastically.
+double CPushPath::Norm() const
+{
+    double norm = 0.0;
+    for (const CPushFlow& flow : m_flows.flows)
+        for (const std::size_t r : flow.Rows())
+            norm = std::max({norm, std::fabs(m_rate.force[r]) / flow.force,
+                             std::fabs(m_rate.plastic[r]) * flow.stiffness / flow.force});
+    return norm;
+}
+
+/// Which way along the line of solutions: rates are those of sign +1.
+double CPushPath::DriveSign() const
+{
+    using KIND = T_PUSH_DRIVE::KIND;
+    const double least = Least();
+    double sum = 0.0;
+    switch (m_drive.kind) {
+    case KIND::Control:
+        sum = m_drive.sign * m_rate.control;
+        break;
+    case KIND::Factor:
+        sum = m_drive.sign * m_rate.factor;
+        break;
+    case KIND::Flows:
+        for (const std::size_t f : m_drive.flows)
+            if (IsActive(f))
+                sum += m_rate.flow[m_place[f] - 1] * m_flows.flows[f].stiffness /
+                       m_flows.flows[f].force;
+        if (std::fabs(sum) > least) return sum > 0.0 ? 1.0 : -1.0;
+        sum = 0.0;
+        break;
+    case KIND::Forces:
+        for (const std::size_t f : m_drive.flows)
+            sum += m_drive.sign * m_flows.flows[f].Value(m_rate.force) / m_flows.flows[f].force;
+        if (std::fabs(sum) > least) return sum > 0.0 ? 1.0 : -1.0;
+        sum = 0.0;
+        break;
+    case KIND::Before:
+        break;
+    }
+    if (sum != 0.0) return sum > 0.0 ? 1.0 : -1.0;
+    // As before: what flows on the backbone goes on, else the forces do.
+    for (std::size_t k = 0; k < m_active.size(); ++k) {
+        const CPushFlow& flow = m_flows.flows[m_active[k]];
+        if (m_flows.backbones[flow.backbone].On() == ON::Virgin)
+            sum += m_rate.flow[k] * flow.stiffness / flow.force;
+    }
+    if (std::fabs(sum) > least) return sum > 0.0 ? 1.0 : -1.0;
+    sum = 0.0;
+    for (const CPushFlow& flow : m_flows.flows)
+        for (const std::size_t r : flow.Rows())
+            if (!m_before.empty()) sum += m_rate.force[r] * m_before[r] / (flow.force * flow.force);
+    return sum >= 0.0 ? 1.0 : -1.0;
+}
+
+int CPushPath::MakeRates()
+{
+    std::vector<double> x;
+    if (!SolveDirection(x)) return 0;
+    RatesOf(x, 1.0);
+    if (DriveSign() < 0.0) RatesOf(x, -1.0);
+    return 1;
+}
+
+/// What can't go on as it is with these rates.
+std::vector<CPushPath::T_CHANGE> CPushPath::Violations()
+{
+    using KIND = T_CHANGE::KIND;
+    std::vector<T_CHANGE> out;
+    const double least = Least();
+    for (std::size_t f = 0; f < m_flows.flows.size(); ++f) {
+        CPushFlow& flow = m_flows.flows[f];
+        const CHingeBackbone& backbone = m_flows.backbones[flow.backbone];
+        if (flow.HangsOnAxial()) {
+            const double slope = flow.Lines()[0].Slope(), other = flow.Lines()[1].Slope();
+            ChoosePart(f);
+            if (IsActive(f) &&
+                (slope != flow.Lines()[0].Slope() || other != flow.Lines()[1].Slope()))
+                out.push_back({f, 0.0, KIND::Part});
+        }
+        if (IsActive(f)) {
+            const double rate = m_rate.flow[m_place[f] - 1] * flow.stiffness / flow.force;
+            const double end = kAtLimit * flow.force / flow.stiffness;
+            if (backbone.On() == ON::Virgin && rate < -least)
+                out.push_back({f, -rate, KIND::Unload});
+            else if (backbone.On() == ON::Back && rate > least && backbone.Room(true) <= end)
+                out.push_back({f, rate, KIND::End});
+            else if (backbone.On() == ON::Back && rate < -least && backbone.Room(false) <= end)
+                out.push_back({f, -rate, KIND::EndBack});
+        } else if (backbone.On() == ON::Locked) {
+            const double rate = PhiRate(f) / flow.force;
+            if (rate > least && Phi(f, backbone.Upper()) >= -Tolerance(f))
+                out.push_back({f, rate, KIND::Start});
+            else if (rate < -least && backbone.Lower() > -CHingeBackbone::kFar &&
+                     Phi(f, backbone.Lower()) <= Tolerance(f))
+                out.push_back({f, -rate, KIND::StartBack});
+        }
+    }
+    return out;
+}
+
+CPushPath::T_FAULT CPushPath::Apply(const T_CHANGE& change)
+{
+    using KIND = T_CHANGE::KIND;
+    Touch(change.flow);
+    CHingeBackbone& backbone = Backbone(change.flow);
+    switch (change.kind) {
+    case KIND::Unload:
+        backbone.Unload();
+        break;
+    case KIND::Start:
+        backbone.Start(true);
+        break;
+    case KIND::StartBack:
+        backbone.Start(false);
+        break;
+    case KIND::End:
+        backbone.End(true);
+        break;
+    case KIND::EndBack:
+        backbone.End(false);
+        break;
+    case KIND::Part: // chosen already
+        break;
+    }
+    return Sync(change.flow);
+}
+
+/// Keeps what the flow was before the changes of an event.
+void CPushPath::Touch(std::size_t f)
+{
+    const CHingeBackbone& backbone = Backbone(f);
+    m_touched.try_emplace(f, T_WAS{backbone.On(), backbone.Vertex()});
+}
+
+/// Vertices passed, hinges that unload and load again.
+void CPushPath::NoteTurns()
+{
+    for (const auto& [f, was] : m_touched) {
+        const CPushFlow& flow = m_flows.flows[f];
+        const CHingeBackbone& now = Backbone(f);
+        const auto note = [&](HINGE_TURN turn, int point) {
+            m_turned.push_back({flow.hinge, flow.law, turn, point, flow.positive});
+        };
+        for (int v = was.vertex + 1; v <= now.Vertex(); ++v)
+            note(HINGE_TURN::Point, v);
+        if (now.Vertex() != was.vertex) continue;
+        const bool wasOn = was.on == ON::Virgin, isOn = now.On() == ON::Virgin;
+        if (wasOn && !isOn && now.On() != ON::Drop) note(HINGE_TURN::Unload, now.Vertex());
+        if (!wasOn && isOn && was.on != ON::Drop) note(HINGE_TURN::Reload, now.Vertex());
+    }
+    m_touched.clear();
+}
+
+CPushPath::WAY CPushPath::Select(T_FAULT& fault)
+{
+    if ((fault = SyncTouched())) return WAY::Fault;
+    for (int round = 0; round < kMostRounds; ++round) {
+        if (!MakeRates()) return WAY::None;
+        std::vector<T_CHANGE> changes = Violations();
+        if (changes.empty()) {
+            NoteTurns();
+            m_before = m_rate.force;
+            return WAY::On;
+        }
+        if (round >= kTogether) { // the largest alone, so that a circle is left
+            const auto worst = std::max_element(
+                changes.begin(), changes.end(),
+                [](const T_CHANGE& a, const T_CHANGE& b) { return a.amount < b.amount; });
+            changes = {*worst};
+        }
+        for (const T_CHANGE& change : changes)
+            if ((fault = Apply(change))) return WAY::Fault;
+    }
+    return WAY::None;
+}
+
+} // namespace solver

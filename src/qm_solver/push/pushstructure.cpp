@@ -1,0 +1,415 @@
+#include "qm_solver/push/pushstructure.h"
+
+#include "qm_solver/checks/mechanism.h"
+#include "qm_solver/checks/modelcheck.h"
+#include "qm_solver/model/frameextent.h"
+
+#include <algorithm>
+#include <cmath>
+#include <map>
+
+namespace solver {
+
+namespace {
+
+T_SOLVER_ERROR Failed(T_SOLVER_REASON reason)
+{
+    T_SOLVER_ERROR error;
+    error.fault = SOLVER_FAULT::Failed;
+    error.reason = std::move(reason);
+    return error;
+}
+
+T_VEC12 Gather(const T_ELEMENT& element, std::span<const double> full)
+{
+    T_VEC12 u{};
+    for (std::size_t k = 0; k < ElementSize(element); ++k)
+        u[k] = full[ElementIndex(element, k)];
+    return u;
+}
+
+T_VEC12 Gather(const T_ELEMENT& element, std::span<const T_VEC6> nodes)
+{
+    T_VEC12 u{};
+    for (std::size_t k = 0; k < ElementSize(element); ++k) {
+        const std::size_t full = ElementIndex(element, k);
+        u[k] = nodes[full / 6][full % 6];
+    }
+    return u;
+}
+
+} // namespace
+
+CPushStructure::CPushStructure(const T_PUSH_MODEL& model)
+    : m_model(model), m_dofs(model.frame), m_extent(Extent(model.frame))
+{
+    MakeRows();
+}
+
+/// A component that two laws name at one place is refused before; the axial force of a place is a
+/// row of its own where no law is on it.
+void CPushStructure::MakeRows()
+{
+    const T_FRAME& frame = m_model.frame;
+    std::vector<std::vector<T_PLACED_COMPONENT>> placed(frame.elements.size());
+    std::vector<std::vector<std::pair<std::size_t, std::size_t>>> ofLaw(m_model.hinges.size());
+    std::vector<std::optional<std::size_t>> axial(m_model.hinges.size());
+    for (std::size_t h = 0; h < m_model.hinges.size(); ++h) {
+        const T_PUSH_HINGE& hinge = m_model.hinges[h];
+        auto& list = placed[hinge.element];
+        bool wantsAxial = false;
+        for (const T_HINGE_LAW& law : hinge.laws) {
+            ofLaw[h].emplace_back(hinge.element, list.size());
+            if (law.component == 0) axial[h] = list.size();
+            wantsAxial = wantsAxial || !law.byAxial.empty();
+            list.push_back({hinge.at, law.component, law.stiffness});
+        }
+        if (wantsAxial && !axial[h]) {
+            axial[h] = list.size();
+            list.push_back({hinge.at, 0, 0.0});
+        }
+    }
+    m_rowsOf.resize(frame.elements.size());
+    for (std::size_t e = 0; e < frame.elements.size(); ++e) {
+        for (std::size_t c = 0; c < placed[e].size(); ++c) {
+            m_rowsOf[e].push_back(m_rows.size());
+            m_rows.push_back({e, c});
+        }
+        m_elements.emplace_back(frame, e, std::move(placed[e]));
+    }
+    for (std::size_t h = 0; h < m_model.hinges.size(); ++h) {
+        auto& rows = m_lawRow.emplace_back();
+        for (const auto& [e, c] : ofLaw[h])
+            rows.push_back(m_rowsOf[e][c]);
+        m_axialRow.push_back(axial[h] ? m_rowsOf[m_model.hinges[h].element][*axial[h]]
+                                      : m_rows.size());
+    }
+    m_termFrom.push_back(0);
+    for (const T_PUSH_ROW& row : m_rows) {
+        const T_ELEMENT& element = frame.elements[row.element];
+        const T_VEC12& influence = m_elements[row.element].Influence(row.component);
+        std::map<int, double> sum;
+        for (std::size_t k = 0; k < ElementSize(element); ++k)
+            for (const T_TERM& t : m_dofs.Terms(ElementIndex(element, k)))
+                if (influence[k] != 0.0) sum[t.index] += t.factor * influence[k];
+        for (const auto& [index, factor] : sum)
+            m_terms.push_back({index, factor});
+        m_termFrom.push_back(m_terms.size());
+    }
+}
+
+CPushStructure::T_FAULT CPushStructure::Prepare()
+{
+    T_SOLVER_REASON reason;
+    if (!m_assembly.Prepare(m_model.frame, m_dofs, reason)) return Failed(reason);
+    if (m_dofs.EquationCount() > 0) {
+        m_assembly.Assemble([&](std::size_t e, T_MATRIX12& k) { m_elements[e].Stiffness(0.0, k); });
+        if (!m_factor.Analyse(m_assembly.Matrix(), m_dofs.Blocks(), reason)) return Failed(reason);
+        T_SOLVER_ERROR error;
+        if (!FactorStable(m_model.frame, m_dofs, m_assembly.Matrix(), m_factor, error))
+            return error;
+        ++m_cost.factorisations;
+    }
+    return {};
+}
+
+CPushStructure::T_FAULT CPushStructure::Factorise(std::vector<double> tension)
+{
+    if (tension.empty() && m_tension.empty()) return {};
+    m_tension = std::move(tension);
+    return Refactorise();
+}
+
+CPushStructure::T_FAULT CPushStructure::Refactorise()
+{
+    if (m_dofs.EquationCount() == 0) return {};
+    m_assembly.Assemble([&](std::size_t e, T_MATRIX12& k) {
+        m_elements[e].Stiffness(m_tension.empty() ? 0.0 : m_tension[e], k);
+    });
+    T_SOLVER_REASON reason;
+    if (!m_factor.Factor(m_assembly.Matrix(), reason, PIVOTS::AsTheyAre)) return Failed(reason);
+    ++m_cost.factorisations;
+    if (m_factor.Info().negativePivots > 0) return Failed("IDS_QM_ENGINE_PUSH_BUCKLES");
+    return {};
+}
+
+CPushStructure::T_FAULT CPushStructure::Solve(std::span<double> sides, std::size_t count)
+{
+    T_SOLVER_REASON reason;
+    m_cost.solves += count;
+    if (m_dofs.EquationCount() > 0 && !m_factor.Solve(sides, count, reason)) return Failed(reason);
+    return {};
+}
+
+CPushStructure::T_FAULT CPushStructure::AddLoads(const T_LOAD_CASE& given, std::size_t number)
+{
+    if (auto fault = CheckCase(m_model.frame, m_dofs, given, number)) return fault;
+    const T_FRAME& frame = m_model.frame;
+    T_PUSH_LOADS& set = m_loads.emplace_back();
+    set.loads = std::make_unique<CCaseLoads>(frame, m_dofs, given);
+    std::vector<double> full(set.loads->Nodal().begin(), set.loads->Nodal().end());
+    const auto addSum = [&](std::size_t index, double force) {
+        T_VEC3 f{};
+        const std::size_t d = index % 6;
+        if (d > 2) {
+            set.sum[d] += force;
+            return;
+        }
+        f[d] = force;
+        set.sum[d] += force;
+        AddPart(set.sum, 3, Cross(frame.nodes[index / 6].xyz, f));
+    };
+    for (std::size_t i = 0; i < full.size(); ++i)
+        if (full[i] != 0.0) addSum(i, full[i]);
+    const auto settled = set.loads->Settled();
+    for (std::size_t e = 0; e < frame.elements.size(); ++e) {
+        const T_ELEMENT& element = frame.elements[e];
+        set.element.push_back(m_elements[e].Loads(set.loads->OnSpan(e), set.loads->Axial(e)));
+        T_ELEMENT_LOADS& own = set.element.back();
+        T_VEC12 moved{};
+        if (!settled.empty()) moved = Gather(element, settled);
+        for (std::size_t c = 0; c < own.force.size() && !settled.empty(); ++c)
+            for (std::size_t k = 0; k < 12; ++k)
+                own.force[c] += m_elements[e].Influence(c)[k] * moved[k];
+        const std::vector<double> none(own.force.size());
+        const T_VEC12 held = m_elements[e].AtNodes({}, none, own.ends, 0.0);
+        for (std::size_t k = 0; k < ElementSize(element); ++k)
+            if (held[k] != 0.0) {
+                full[ElementIndex(element, k)] -= held[k];
+                addSum(ElementIndex(element, k), -held[k]);
+            }
+        if (settled.empty()) continue;
+        const T_VEC12 forced = m_elements[e].AtNodes(moved, none, {}, 0.0);
+        for (std::size_t k = 0; k < ElementSize(element); ++k)
+            full[ElementIndex(element, k)] -= forced[k];
+    }
+    set.side.assign(m_dofs.EquationCount(), 0.0);
+    m_dofs.Reduce(full, set.side);
+    return {};
+}
+
+CPushStructure::T_FAULT CPushStructure::SolveLoads()
+{
+    const std::size_t n = m_dofs.EquationCount();
+    std::vector<double> sides;
+    for (const T_PUSH_LOADS& set : m_loads)
+        sides.insert(sides.end(), set.side.begin(), set.side.end());
+    if (auto fault = Solve(sides, m_loads.size())) return fault;
+    for (std::size_t l = 0; l < m_loads.size(); ++l) {
+        T_PUSH_LOADS& set = m_loads[l];
+        set.unknowns.assign(sides.begin() + static_cast<long>(l * n),
+                            sides.begin() + static_cast<long>((l + 1) * n));
+        set.force.resize(RowCount());
+        for (std::size_t r = 0; r < RowCount(); ++r) {
+            double sum = set.element[m_rows[r].element].force[m_rows[r].component];
+            for (std::size_t k = m_termFrom[r]; k < m_termFrom[r + 1]; ++k)
+                sum += m_terms[k].factor * set.unknowns[static_cast<std::size_t>(m_terms[k].index)];
+            set.force[r] = sum;
+        }
+    }
+    return {};
+}
+
+CPushStructure::T_FAULT CPushStructure::Columns(std::span<const std::size_t> rows,
+                                                std::span<const T_PROBE> probes,
+                                                std::vector<double>& forces,
+                                                std::vector<double>& values)
+{
+    const std::size_t n = m_dofs.EquationCount(), count = rows.size();
+    std::vector<double> x(n * count, 0.0);
+    for (std::size_t c = 0; c < count; ++c)
+        for (std::size_t k = m_termFrom[rows[c]]; k < m_termFrom[rows[c] + 1]; ++k)
+            x[c * n + static_cast<std::size_t>(m_terms[k].index)] = m_terms[k].factor;
+    if (auto fault = Solve(x, count)) return fault;
+    m_cost.columns += count;
+    forces.resize(RowCount() * count);
+    values.resize(probes.size() * count);
+    for (std::size_t c = 0; c < count; ++c) {
+        const std::span<const double> own(x.data() + c * n, n);
+        double* column = forces.data() + c * RowCount();
+        for (std::size_t r = 0; r < RowCount(); ++r) {
+            double sum = 0.0;
+            for (std::size_t k = m_termFrom[r]; k < m_termFrom[r + 1]; ++k)
+                sum += m_terms[k].factor * own[static_cast<std::size_t>(m_terms[k].index)];
+            column[r] = sum;
+        }
+        const std::size_t e = m_rows[rows[c]].element;
+        for (const std::size_t r : m_rowsOf[e])
+            column[r] -= m_elements[e].Own(m_rows[r].component, m_rows[rows[c]].component);
+        for (std::size_t p = 0; p < probes.size(); ++p)
+            values[c * probes.size() + p] = Value(probes[p], own);
+    }
+    return {};
+}
+
+T_PROBE CPushStructure::Displacement(std::size_t node, std::size_t direction) const
+{
+    const auto terms = m_dofs.Terms(6 * node + direction);
+    return {terms.begin(), terms.end()};
+}
+
+double CPushStructure::Value(const T_PROBE& probe, std::span<const double> unknowns) const
+{
+    double sum = 0.0;
+    for (const T_TERM& t : probe)
+        sum += t.factor * unknowns[static_cast<std::size_t>(t.index)];
+    return sum;
+}
+
+double CPushStructure::Settled(std::size_t set, std::size_t node, std::size_t direction) const
+{
+    const auto settled = m_loads[set].loads->Settled();
+    return settled.empty() ? 0.0 : settled[6 * node + direction];
+}
+
+std::vector<double> CPushStructure::PlasticOf(std::size_t element,
+                                              std::span<const double> plastic) const
+{
+    std::vector<double> own;
+    for (const std::size_t r : m_rowsOf[element])
+        own.push_back(plastic[r]);
+    return own;
+}
+
+T_VEC12 CPushStructure::ElementLoads(std::size_t element, std::span<const double> factors) const
+{
+    T_VEC12 ends{};
+    for (std::size_t l = 0; l < factors.size(); ++l)
+        for (std::size_t k = 0; k < 12; ++k)
+            ends[k] += factors[l] * m_loads[l].element[element].ends[k];
+    return ends;
+}
+
+/// Reactions and, over the unknowns, the loads less the forces of the elements.
+void CPushStructure::Balance(const T_PUSH_STATE& state, std::span<const double> full,
+                             T_PUSH_STEP& step, std::vector<double>& left)
+{
+    const T_FRAME& frame = m_model.frame;
+    std::vector<double> held(m_dofs.FullCount());
+    double largest = 0.0;
+    const auto measure = [&](std::size_t index, double force) {
+        largest = std::max(largest, std::fabs(force) / (index % 6 < 3 ? 1.0 : m_extent));
+    };
+    for (std::size_t l = 0; l < state.factors.size(); ++l) {
+        const auto nodal = m_loads[l].loads->Nodal();
+        for (std::size_t i = 0; i < held.size(); ++i)
+            held[i] -= state.factors[l] * nodal[i];
+    }
+    for (std::size_t i = 0; i < held.size(); ++i)
+        measure(i, held[i]);
+    step.base = {};
+    const auto addBase = [&](std::size_t index, double force) {
+        const std::size_t d = index % 6;
+        step.base[d] += force;
+        if (d > 2) return;
+        T_VEC3 f{};
+        f[d] = force;
+        AddPart(step.base, 3, Cross(frame.nodes[index / 6].xyz, f));
+    };
+    for (std::size_t e = 0; e < frame.elements.size(); ++e) {
+        const T_ELEMENT& element = frame.elements[e];
+        const T_VEC12 forces = m_elements[e].AtNodes(
+            Gather(element, full), PlasticOf(e, state.plastic), ElementLoads(e, state.factors),
+            m_tension.empty() ? 0.0 : m_tension[e]);
+        for (std::size_t k = 0; k < ElementSize(element); ++k) {
+            held[ElementIndex(element, k)] += forces[k];
+            measure(k, forces[k]);
+            if (element.kind == ELEMENT_KIND::Spring) addBase(ElementIndex(element, k), -forces[k]);
+        }
+    }
+    left.assign(m_dofs.EquationCount(), 0.0);
+    for (std::size_t i = 0; i < held.size(); ++i)
+        for (const T_TERM& t : m_dofs.FixedTerms(i))
+            addBase(static_cast<std::size_t>(t.index), t.factor * held[i]);
+    for (double& h : held)
+        h = -h;
+    m_dofs.Reduce(held, left);
+    double worst = 0.0;
+    for (std::size_t i = 0; i < left.size(); ++i) {
+        const bool turns = m_dofs.Owner(i) % 6 > 2;
+        worst = std::max(worst, std::fabs(left[i]) / (turns ? m_extent : 1.0));
+    }
+    m_largest = std::max(m_largest, largest);
+    step.residual = m_largest > 0.0 ? worst / m_largest : worst;
+}
+
+CPushStructure::T_FAULT CPushStructure::Displace(std::span<const T_PUSH_STATE> states,
+                                                 std::span<T_PUSH_STEP> steps)
+{
+    constexpr double kRefine = 1e-11; // residual from which a solution is refined
+    const std::size_t n = m_dofs.EquationCount();
+    std::vector<double> x(n * states.size(), 0.0);
+    for (std::size_t s = 0; s < states.size(); ++s) {
+        double* side = x.data() + s * n;
+        for (std::size_t l = 0; l < states[s].factors.size(); ++l)
+            for (std::size_t i = 0; i < n; ++i)
+                side[i] += states[s].factors[l] * m_loads[l].side[i];
+        for (std::size_t r = 0; r < RowCount(); ++r)
+            if (const double q = states[s].plastic[r]; q != 0.0)
+                for (std::size_t k = m_termFrom[r]; k < m_termFrom[r + 1]; ++k)
+                    side[static_cast<std::size_t>(m_terms[k].index)] += q * m_terms[k].factor;
+    }
+    if (auto fault = Solve(x, states.size())) return fault;
+    std::vector<double> full(m_dofs.FullCount()), left;
+    for (std::size_t s = 0; s < states.size(); ++s) {
+        const std::span<double> own(x.data() + s * n, n);
+        const auto take = [&] {
+            m_dofs.Expand(own, full);
+            for (std::size_t l = 0; l < states[s].factors.size(); ++l)
+                if (const auto settled = m_loads[l].loads->Settled(); !settled.empty())
+                    for (std::size_t i = 0; i < full.size(); ++i)
+                        full[i] += states[s].factors[l] * settled[i];
+            Balance(states[s], full, steps[s], left);
+        };
+        take();
+        if (steps[s].residual > kRefine && n > 0) {
+            if (auto fault = Solve(left, 1)) return fault;
+            for (std::size_t i = 0; i < n; ++i)
+                own[i] += left[i];
+            take();
+        }
+        steps[s].nodes.resize(m_model.frame.nodes.size());
+        for (std::size_t i = 0; i < full.size(); ++i)
+            steps[s].nodes[i / 6][i % 6] = full[i];
+    }
+    return {};
+}
+
+void CPushStructure::Inside(const T_PUSH_STATE& state, const T_PUSH_STEP& step, T_RESULT& out) const
+{
+    const T_FRAME& frame = m_model.frame;
+    out.displacement = step.nodes;
+    out.force.assign(frame.elements.size(), {});
+    for (std::size_t e = 0; e < frame.elements.size(); ++e) {
+        std::vector<T_SPAN_LOAD> span;
+        for (std::size_t l = 0; l < state.factors.size(); ++l)
+            for (T_SPAN_LOAD load : m_loads[l].loads->OnSpan(e)) {
+                load.w0 = Scaled(load.w0, state.factors[l]);
+                load.w1 = Scaled(load.w1, state.factors[l]);
+                span.push_back(load);
+            }
+        const T_VEC12 u = Gather(frame.elements[e], step.nodes);
+        for (std::size_t p = 0; p < kBeamPositions; ++p)
+            out.force[e][p] =
+                m_elements[e].Inside(u, PlasticOf(e, state.plastic), ElementLoads(e, state.factors),
+                                     span, 0.25 * static_cast<double>(p));
+    }
+}
+
+std::vector<double> CPushStructure::Tensions(const T_PUSH_STATE& state,
+                                             std::span<const T_VEC6> displacement) const
+{
+    const T_FRAME& frame = m_model.frame;
+    std::vector<double> tension(frame.elements.size(), 0.0);
+    for (std::size_t e = 0; e < tension.size(); ++e) {
+        const ELEMENT_KIND kind = frame.elements[e].kind;
+        if (kind != ELEMENT_KIND::Beam && kind != ELEMENT_KIND::Truss) continue;
+        const T_VEC12 u = Gather(frame.elements[e], displacement);
+        const std::vector<double> plastic = PlasticOf(e, state.plastic);
+        const T_VEC12 loads = ElementLoads(e, state.factors);
+        tension[e] = m_elements[e].Tension(u, plastic, loads);
+    }
+    return tension;
+}
+
+} // namespace solver

@@ -1,0 +1,126 @@
+// The elastic frame behind a push: its factor, its answers to loads and to plastic deformations.
+#pragma once
+
+#include "qm_solver/frame/frameassembly.h"
+#include "qm_solver/push/pushelement.h"
+#include "qm_solver/pushmodel.h"
+#include "qm_solver/pushresult.h"
+
+#include <memory>
+#include <optional>
+
+namespace solver {
+
+/// A force of an element that is watched or flows: of its hinges' laws and, where strengths hang on
+/// it, the axial force at their places.
+struct T_PUSH_ROW {
+    std::size_t element = 0;
+    std::size_t component = 0; // of the CPushElement
+};
+
+/// A linear functional of the unknowns: a displacement.
+using T_PROBE = std::vector<T_TERM>;
+
+/// One set of loads at factor 1, and the elastic answer to it.
+struct T_PUSH_LOADS {
+    std::unique_ptr<CCaseLoads> loads;
+    std::vector<T_ELEMENT_LOADS> element; // by element
+    std::vector<double> side;             // right-hand side over the unknowns
+    std::vector<double> unknowns;         // solution
+    std::vector<double> force;            // by row
+    T_VEC6 sum{}; // resultant about the origin: nodal loads and loads on elements
+};
+
+/// A displaced state of the whole structure.
+struct T_PUSH_STATE {
+    std::vector<double> factors; // by set of loads
+    std::vector<double> plastic; // by row
+};
+
+class CPushStructure {
+public:
+    using T_FAULT = std::optional<T_SOLVER_ERROR>;
+
+    explicit CPushStructure(const T_PUSH_MODEL& model);
+
+    /// Rows, pattern, symbolic factorisation and the first factorisation.
+    T_FAULT Prepare();
+    /// Factorises with the couples of these axial forces, by element; empty: first order. Answers
+    /// to loads and plastic deformations are those of the last factorisation: they are to be asked
+    /// for again. Compression that the elastic frame can't stand is a fault.
+    T_FAULT Factorise(std::vector<double> tension);
+    /// The same factor once more.
+    T_FAULT Refactorise();
+    std::span<const double> Tension() const { return m_tension; }
+    /// Checks and takes a set of loads, the next one; `number` names it in a fault.
+    T_FAULT AddLoads(const T_LOAD_CASE& loads, std::size_t number);
+    void DropLoads()
+    {
+        m_loads.clear();
+        m_largest = 0.0;
+    }
+    T_FAULT SolveLoads();
+
+    std::size_t RowCount() const { return m_rows.size(); }
+    std::size_t LoadCount() const { return m_loads.size(); }
+    const T_PUSH_LOADS& Loads(std::size_t number) const { return m_loads[number]; }
+    /// Row of a law of a hinge, and of the axial force at its place (none: RowCount()).
+    std::size_t RowOf(std::size_t hinge, std::size_t law) const { return m_lawRow[hinge][law]; }
+    std::size_t AxialRow(std::size_t hinge) const { return m_axialRow[hinge]; }
+
+    /// Force of a row by a unit of its own plastic deformation while the nodes are held.
+    double OwnStiffness(std::size_t row) const
+    {
+        return m_elements[m_rows[row].element].Own(m_rows[row].component, m_rows[row].component);
+    }
+    /// Forces of all rows and values of the probes by unit plastic deformations of these rows, one
+    /// column after the other, solved in one block.
+    T_FAULT Columns(std::span<const std::size_t> rows, std::span<const T_PROBE> probes,
+                    std::vector<double>& forces, std::vector<double>& values);
+    T_PROBE Displacement(std::size_t node, std::size_t direction) const;
+    double Value(const T_PROBE& probe, std::span<const double> unknowns) const;
+    /// What settlements add to the displacement of a node.
+    double Settled(std::size_t set, std::size_t node, std::size_t direction) const;
+
+    /// Displacements of all nodes of states, reactions and the residual, one solve for all. The
+    /// steps come with their forces where `forces` is given.
+    T_FAULT Displace(std::span<const T_PUSH_STATE> states, std::span<T_PUSH_STEP> steps);
+    /// Forces inside all elements of a displaced state.
+    void Inside(const T_PUSH_STATE& state, const T_PUSH_STEP& step, T_RESULT& out) const;
+    /// Mean axial force of each beam and truss in a displaced state, tension positive.
+    std::vector<double> Tensions(const T_PUSH_STATE& state,
+                                 std::span<const T_VEC6> displacement) const;
+
+    const T_FRAME& Frame() const { return m_model.frame; }
+    const CFrameDofs& Dofs() const { return m_dofs; }
+    const T_SYMMETRIC_MATRIX& Matrix() const { return m_assembly.Matrix(); }
+    CSparseFactor& Factor() { return m_factor; }
+    const T_PUSH_COST& Cost() const { return m_cost; }
+    T_PUSH_COST& Cost() { return m_cost; }
+
+private:
+    void MakeRows();
+    T_FAULT Solve(std::span<double> sides, std::size_t count);
+    std::vector<double> PlasticOf(std::size_t element, std::span<const double> plastic) const;
+    T_VEC12 ElementLoads(std::size_t element, std::span<const double> factors) const;
+    void Balance(const T_PUSH_STATE& state, std::span<const double> full, T_PUSH_STEP& step,
+                 std::vector<double>& left);
+
+    const T_PUSH_MODEL& m_model;
+    CFrameDofs m_dofs;
+    CFrameAssembly m_assembly;
+    CSparseFactor m_factor;
+    double m_extent = 1.0;
+    std::vector<CPushElement> m_elements;
+    std::vector<T_PUSH_ROW> m_rows;
+    std::vector<std::vector<std::size_t>> m_lawRow, m_rowsOf; // by hinge; by element
+    std::vector<std::size_t> m_axialRow;
+    std::vector<std::size_t> m_termFrom; // influence of the rows over the unknowns
+    std::vector<T_TERM> m_terms;
+    std::vector<double> m_tension; // of the factor; empty: first order
+    std::vector<T_PUSH_LOADS> m_loads;
+    double m_largest = 0.0; // force of the run so far, what residuals are compared with
+    T_PUSH_COST m_cost;
+};
+
+} // namespace solver
