@@ -68,7 +68,8 @@ struct T_PUSH_HINGE {
     HINGE_FLOW flow = HINGE_FLOW::Rotations;
 };
 
-/// Axial forces whose couple (force times lateral drift of the element) acts on the structure.
+/// Axial forces whose couple (force times lateral drift of the element) acts on the structure. Of
+/// beams and trusses that are not level: the force along a floor has no such couple.
 enum class P_DELTA { None, Initial, Updated };
 
 enum class PUSH_CONTROL { LoadFactor, Displacement, LargestTranslation };
@@ -111,6 +112,7 @@ struct T_PUSH_MODEL {
     std::vector<T_PUSH_HINGE> hinges;
     T_LOAD_CASE initial; // loads that stand before the first stage; brought in from 0 to 1
     P_DELTA pDelta = P_DELTA::None;
+    int vertical = 2; // axis of gravity: 0 X, 1 Y, 2 Z
     std::vector<T_PUSH_DRIFT> drifts;
     std::size_t mostEvents = 100000;
     /// Go on along the path where the control displacement falls back although no later

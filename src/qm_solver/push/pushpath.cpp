@@ -119,12 +119,12 @@ void CPushPath::ChoosePart(std::size_t f)
         if (line.IsGiven()) line.Choose(m_force[flow.AxialRow()], rate);
 }
 
-double CPushPath::NextEvent() const
+double CPushPath::NextEvent(double back) const
 {
     const double least = Least();
     double first = CHingeBackbone::kFar;
     const auto take = [&](double distance, double rate) {
-        first = std::min(first, std::max(0.0, distance) / rate);
+        first = std::min(first, std::max(-back, distance / rate));
     };
     for (std::size_t f = 0; f < m_flows.flows.size(); ++f) {
         const CPushFlow& flow = m_flows.flows[f];

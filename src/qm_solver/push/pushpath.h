@@ -62,8 +62,11 @@ public:
     void SetDrive(T_PUSH_DRIVE drive) { m_drive = std::move(drive); }
     const T_PUSH_RATE& Rate() const { return m_rate; }
 
-    /// Parameter to the next event along the rates; infinite without one.
-    double NextEvent() const;
+    /// Parameter to the next event along the rates; infinite without one. `back`: how far behind an
+    /// event may lie that another factorisation has moved.
+    double NextEvent(double back = 0.0) const;
+    /// The rates once more, of the same flows.
+    [[nodiscard]] int Again() { return MakeRates(); }
     void Advance(double by);
     /// Turns what has come to its event; the hinges that have turned are in Turned. -1, or the
     /// hinge whose axial force has left its line of strength.

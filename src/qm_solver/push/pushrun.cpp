@@ -67,7 +67,7 @@ CPushRun::T_FAULT CPushRun::Initial(T_PUSH_END& end, bool& goesOn)
         const T_PUSH_STATE state = m_path->State();
         T_PUSH_STEP step;
         if (auto fault = m_structure.Displace({&state, 1}, {&step, 1})) return fault;
-        std::vector<double> now = m_structure.Tensions(state, step.nodes);
+        std::vector<double> now = m_structure.Tensions(state, step.nodes, true);
         if (!Differ(now, tension)) break;
         tension = now;
         if (auto fault = m_structure.Factorise(std::move(now))) return fault;
@@ -316,13 +316,28 @@ CPushRun::T_FAULT CPushRun::Update(const T_PUSH_STAGE&, std::optional<double> co
         const T_PUSH_STATE state = m_path->State();
         T_PUSH_STEP step;
         if (auto fault = m_structure.Displace({&state, 1}, {&step, 1})) return fault;
-        std::vector<double> now = m_structure.Tensions(state, step.nodes);
+        std::vector<double> now = m_structure.Tensions(state, step.nodes, true);
         if (!Differ(now, m_structure.Tension())) break;
         if (auto fault = m_structure.Factorise(std::move(now))) return fault;
         if (auto fault = m_structure.SolveLoads()) return fault;
         if (auto fault = m_path->Renew()) return fault;
         if (auto fault = m_path->Correct(control)) return fault;
     }
+    return {};
+}
+
+/// The event that the axial forces of the last factorisation have told, with those of here.
+CPushRun::T_FAULT CPushRun::Approach(const T_PUSH_STAGE& stage, double by)
+{
+    const double here = Present(stage);
+    if (auto fault = Update(stage, stage.control == PUSH_CONTROL::LoadFactor
+                                       ? std::nullopt
+                                       : std::optional(here)))
+        return fault;
+    m_path->SetDrive({T_PUSH_DRIVE::KIND::Before, 1.0, {}});
+    if (!m_path->Again()) return {};
+    const double left = m_path->NextEvent(by);
+    if (left < by) m_path->Advance(left);
     return {};
 }
 
@@ -360,7 +375,8 @@ CPushRun::T_FAULT CPushRun::Flush(T_PUSH_END& end)
             m_cancelled = true;
             break;
         }
-        const std::vector<double> tension = m_structure.Tensions(m_states[s], m_steps[s].nodes);
+        const std::vector<double> tension =
+            m_structure.Tensions(m_states[s], m_steps[s].nodes, false);
         for (const T_PUSH_HINGE& hinge : m_model.hinges)
             m_steps[s].axial.push_back(tension[hinge.element]);
         m_kept.push_back(
@@ -427,6 +443,7 @@ CPushRun::T_FAULT CPushRun::Follow(const T_PUSH_STAGE& stage, int number, T_PUSH
             return fault;
         }
         if (toEvent <= by) {
+            if (IsUpdated() && number >= 0 && (fault = Approach(stage, by))) return fault;
             if (++m_eventCount > m_model.mostEvents) return finish(PUSH_OUTCOME::TooManyEvents);
             ++m_structure.Cost().events;
             const long outside = m_path->Turn();

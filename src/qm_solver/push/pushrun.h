@@ -42,6 +42,7 @@ private:
     void NoteEvent(const T_PUSH_STAGE& stage, int number);
     T_FAULT Store(const T_PUSH_STAGE& stage, int number, bool additional, T_PUSH_END& end);
     T_FAULT Update(const T_PUSH_STAGE& stage, std::optional<double> control);
+    T_FAULT Approach(const T_PUSH_STAGE& stage, double by);
     T_FAULT Flush(T_PUSH_END& end);
 
     const T_PUSH_MODEL& m_model;

@@ -38,6 +38,13 @@ T_VEC12 Gather(const T_ELEMENT& element, std::span<const T_VEC6> nodes)
     return u;
 }
 
+/// Rises by less than a thousandth of its length.
+bool IsLevel(const T_FRAME& frame, const T_ELEMENT& element, int vertical)
+{
+    const T_VEC3 along = Minus(frame.nodes[element.j].xyz, frame.nodes[element.i].xyz);
+    return std::fabs(along[static_cast<std::size_t>(vertical)]) < 1e-3 * Norm(along);
+}
+
 } // namespace
 
 CPushStructure::CPushStructure(const T_PUSH_MODEL& model)
@@ -397,13 +404,15 @@ void CPushStructure::Inside(const T_PUSH_STATE& state, const T_PUSH_STEP& step, 
 }
 
 std::vector<double> CPushStructure::Tensions(const T_PUSH_STATE& state,
-                                             std::span<const T_VEC6> displacement) const
+                                             std::span<const T_VEC6> displacement,
+                                             bool coupled) const
 {
     const T_FRAME& frame = m_model.frame;
     std::vector<double> tension(frame.elements.size(), 0.0);
     for (std::size_t e = 0; e < tension.size(); ++e) {
         const ELEMENT_KIND kind = frame.elements[e].kind;
         if (kind != ELEMENT_KIND::Beam && kind != ELEMENT_KIND::Truss) continue;
+        if (coupled && IsLevel(frame, frame.elements[e], m_model.vertical)) continue;
         const T_VEC12 u = Gather(frame.elements[e], displacement);
         const std::vector<double> plastic = PlasticOf(e, state.plastic);
         const T_VEC12 loads = ElementLoads(e, state.factors);

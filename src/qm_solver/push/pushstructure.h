@@ -87,9 +87,10 @@ public:
     T_FAULT Displace(std::span<const T_PUSH_STATE> states, std::span<T_PUSH_STEP> steps);
     /// Forces inside all elements of a displaced state.
     void Inside(const T_PUSH_STATE& state, const T_PUSH_STEP& step, T_RESULT& out) const;
-    /// Mean axial force of each beam and truss in a displaced state, tension positive.
-    std::vector<double> Tensions(const T_PUSH_STATE& state,
-                                 std::span<const T_VEC6> displacement) const;
+    /// Mean axial force of each beam and truss in a displaced state, tension positive; `coupled`:
+    /// of those that P-Delta acts on, 0 of others.
+    std::vector<double> Tensions(const T_PUSH_STATE& state, std::span<const T_VEC6> displacement,
+                                 bool coupled) const;
 
     const T_FRAME& Frame() const { return m_model.frame; }
     const CFrameDofs& Dofs() const { return m_dofs; }
