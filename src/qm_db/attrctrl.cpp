@@ -45,6 +45,12 @@ int CAttrCtrl::GetStyp(T_STYP_D& out) const
     return 1;
 }
 
+int CAttrCtrl::GetPogc(T_POGC_D& out) const
+{
+    out = m_data.Model().pushControl; // it has no quantities
+    return 1;
+}
+
 int CAttrCtrl::GetConsNode(int id, std::array<int, 6>& out) const
 {
     const auto it = m_data.Model().nodes.find(id);

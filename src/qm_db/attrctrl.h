@@ -51,6 +51,8 @@ public:
     /// Title, units and gravity of the model; gravity only where the model states one.
     [[nodiscard]] int GetStyp(T_STYP_D& out) const;
     [[nodiscard]] int GetNode(int id, T_NODE_D& out) const { return Get(id, out); }
+    /// Global control of the pushover analysis; every model has one.
+    [[nodiscard]] int GetPogc(T_POGC_D& out) const;
     /// Restraints of a node, 1 where restrained, in the order X, Y, Z, RX, RY, RZ.
     [[nodiscard]] int GetConsNode(int id, std::array<int, 6>& out) const;
     [[nodiscard]] int GetPolc(int key, T_POLC_D& out) const { return Get(key, out); }

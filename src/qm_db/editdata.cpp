@@ -43,6 +43,35 @@ int CEditData::PutStyp(T_STYP_D styp)
                                      std::make_shared<const T_STYP_D>(std::move(styp))});
 }
 
+int CEditData::PutPogc(T_POGC_D control)
+{
+    if (!m_open) return 0;
+    return Record(T_CHANGE<T_POGC_D>{0,
+                                     std::make_shared<const T_POGC_D>(m_data.Model().pushControl),
+                                     std::make_shared<const T_POGC_D>(std::move(control))});
+}
+
+int CEditData::RenamePush(int key, const std::string& name)
+{
+    const T_MODEL& model = m_data.Model();
+    const auto it = model.pushovers.find(key);
+    if (it == model.pushovers.end() || it->second.name == name) return 1;
+    const std::string before = it->second.name;
+    for (const auto& [other, stored] : model.evaluations) {
+        if (stored.push != before) continue;
+        T_EVAL_D after = stored;
+        after.push = name;
+        if (!Change<T_EVAL_D>(other, std::make_shared<const T_EVAL_D>(std::move(after)))) return 0;
+    }
+    for (const auto& [other, stored] : model.pushovers) {
+        if (other == key || before.empty() || stored.initialCase != before) continue;
+        T_POLC_D after = stored;
+        after.initialCase = name;
+        if (!Change<T_POLC_D>(other, std::make_shared<const T_POLC_D>(std::move(after)))) return 0;
+    }
+    return 1;
+}
+
 int CEditData::ErasePhgt(int key, std::vector<int>& users)
 {
     users = ElementsWithHingeType(m_data.Model(), key);

@@ -27,7 +27,8 @@ public:
     bool IsOpen() const { return m_open; }
 
     /// Adds or replaces the record with that key; quantities in the document's current units.
-    /// Members that the record does not use get their defaults (FitRecord). 1 done; 0 no step is
+    /// Members that the record does not use get their defaults (FitRecord). What refers to a
+    /// pushover load case by its name follows it to a new one. 1 done; 0 no step is
     /// open, or the record is a combination that would contain itself.
     template <class T>
     [[nodiscard]] int Put(int key, T record)
@@ -37,6 +38,9 @@ public:
             if (ContainsItself(key, record)) return 0;
         }
         RecordToSi(record, m_data.Units());
+        if constexpr (std::is_same_v<T, T_POLC_D>) {
+            if (!RenamePush(key, record.name)) return 0;
+        }
         return Change<T>(key, std::make_shared<const T>(std::move(record)));
     }
     /// Deletes the record. 1 done; 0 no step is open, there is no such record, or other records
@@ -64,6 +68,8 @@ public:
     /// Title, current units and gravity (in the units that the record itself names). Changing
     /// the units changes no stored quantity.
     [[nodiscard]] int PutStyp(T_STYP_D styp);
+    /// Global control of the pushover analysis. 1 done; 0 no step is open.
+    [[nodiscard]] int PutPogc(T_POGC_D control);
 
 private:
     template <class T>
@@ -77,6 +83,8 @@ private:
         return Record(std::move(change));
     }
     int Record(T_CHANGE_ANY change);
+    /// What names the load case of this key follows it to its new name.
+    int RenamePush(int key, const std::string& name);
     bool ContainsItself(int key, const T_LCOM_D& record) const;
 
     CDataCtrl& m_data;

@@ -5,4 +5,5 @@
 #include "qm_db/records/evaluationrules.h"
 #include "qm_db/records/hingenames.h"
 #include "qm_db/records/loadcaserules.h"
+#include "qm_db/records/pushcontrol.h"
 #include "qm_db/records/structnames.h"

@@ -3,6 +3,7 @@
 
 #include "qm_db/records/hingerecords.h"
 #include "qm_db/records/loadrecords.h"
+#include "qm_db/records/pushrecords.h"
 #include "qm_db/records/stagerecords.h"
 #include "qm_db/records/units.h"
 
@@ -123,49 +124,6 @@ struct T_SPFC_D {
     bool operator==(const T_SPFC_D&) const = default;
 };
 
-/// Directions of control: 1 to 6 as the pushover load case names them.
-inline constexpr std::array<const char*, 6> kDirectionNames{"DX", "DY", "DZ", "RX", "RY", "RZ"};
-/// Kinds of load pattern: 0 static load, 1 uniform acceleration, 2 mode shape,
-/// 3 mode shape times storey mass.
-inline constexpr std::array<const char*, 4> kPatternNames{"static", "acceleration", "mode",
-                                                          "mode x story mass"};
-
-/// One row of a load case's pattern list.
-struct T_POLC_PATTERN {
-    int kind = 0;        // 0 static load case, 1 uniform acceleration, 2 mode, 3 mode x storey mass
-    int number = 0;      // key of the static load case, direction 1 to 3, or mode number
-    double factor = 1.0; // scale factor, not 0
-    bool operator==(const T_POLC_PATTERN&) const = default;
-};
-
-/// How the solver increments a load case and when it stops.
-struct T_POLC_CONTROL {
-    int incrementMethod = 1;          // 1 displacement control, else force control
-    int incrementOption = 0;          // 2: increments follow an increment function
-    int incrementFunction = 0;        // its key
-    double stiffnessRatioLimit = 0.0; // current stiffness / initial stiffness, stop criterion
-    bool generateStaticAngle = false;
-    double staticAngle = 0.0; // degrees
-    bool masterNodeControl = true;
-    double masterMaxDispl = 0.0; // of the master node, length; sign gives the direction
-    double maxTransDispl = 0.0;  // largest translation of any node, length
-    bool operator==(const T_POLC_CONTROL&) const = default;
-};
-
-/// Pushover load case.
-struct T_POLC_D {
-    std::string name;
-    int controlNode = 0;                     // node whose displacement is followed
-    int direction = 1;                       // 1 to 6: DX, DY, DZ, RX, RY, RZ
-    int patternKind = 0;                     // kind of the master load pattern, 0 to 3
-    std::vector<int> modes;                  // mode numbers that the pattern names, in order
-    std::vector<T_POLC_PATTERN> patterns{};  // pattern rows, may be empty
-    std::optional<T_POLC_CONTROL> control{}; // absent for a case from another solver
-    int controlOption = 1; // 1: the node named above; else evaluations take the one that has moved
-                           // most at the last step
-    bool operator==(const T_POLC_D&) const = default;
-};
-
 /// Evaluation methods; the codes are also those of the spectral plot types.
 enum class PUSH_METHOD { Fema440 = 4, Atc40 = 5, Ec8Opcm = 6, Ntc2008 = 7, Ntc2018 = 8 };
 
@@ -216,6 +174,7 @@ using T_TABLE = std::map<int, T>;
 /// The whole model but its results, in SI.
 struct T_MODEL {
     T_STYP_D styp;
+    T_POGC_D pushControl;
     T_TABLE<T_NODE_D> nodes;              // by node id
     T_TABLE<T_STOR_D> storeys;            // 1, 2, ... bottom to top
     T_TABLE<T_EIGV_D> modes;              // by mode number

@@ -14,6 +14,8 @@ void ApplyOne(T_MODEL& model, int key, const std::shared_ptr<const T>& value)
 {
     if constexpr (std::is_same_v<T, T_STYP_D>) {
         if (value) model.styp = *value;
+    } else if constexpr (std::is_same_v<T, T_POGC_D>) {
+        if (value) model.pushControl = *value;
     } else if (value) {
         TableOf<T>(model).insert_or_assign(key, *value);
     } else {

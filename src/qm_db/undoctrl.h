@@ -17,7 +17,8 @@ struct T_CHANGE {
 };
 
 template <class... R>
-std::variant<T_CHANGE<T_STYP_D>, T_CHANGE<R>...> ChangeOf(const std::tuple<T_RECORD_ROW<R>...>&);
+std::variant<T_CHANGE<T_STYP_D>, T_CHANGE<T_POGC_D>, T_CHANGE<R>...>
+ChangeOf(const std::tuple<T_RECORD_ROW<R>...>&);
 using T_CHANGE_ANY = decltype(ChangeOf(kRecords)); // of any record
 
 /// What one command of the user changed.

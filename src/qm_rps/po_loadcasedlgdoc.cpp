@@ -90,14 +90,6 @@ bool CPO_LoadCaseDlg::HasResults() const
 
 bool CPO_LoadCaseDlg::Store(CEditScope& edit, const T_POLC_D& record)
 {
-    T_POLC_D before;
-    if (m_key != 0 && Doc()->Attr().GetPolc(m_key, before) && before.name != record.name)
-        for (const auto& [key, stored] : Doc()->Data().Model().evaluations) {
-            T_EVAL_D eval;
-            if (stored.push != before.name || !Doc()->Attr().GetEval(key, eval)) continue;
-            eval.push = record.name;
-            if (!edit.Put(key, std::move(eval))) return false;
-        }
     const int key = m_key != 0 ? m_key : NextKey(*Doc());
     if (!edit.Put(key, record)) return false;
     m_key = key;

@@ -20,17 +20,31 @@ void CCaseGet::NeedRef(const char* key, int& out, RECORD_KIND kind)
 {
     if (!Take(key)) return;
     CJsonReader member = m_in.Member(key);
-    const bool byKey = kind == KindOf<T_MATL_D>() || kind == KindOf<T_SECT_D>();
-    if (!m_names || (byKey && !member.IsText())) {
-        member.Read(out);
-        if (m_names && out != 0 && !m_names->HasKey(kind, out)) FailRef(member, kind);
+    ReadRef(member, out, kind, kind == KindOf<T_MATL_D>() || kind == KindOf<T_SECT_D>());
+}
+
+void CCaseGet::ReadRef(CJsonReader& in, int& out, RECORD_KIND kind, bool mayBeKey) const
+{
+    if (!m_names || (mayBeKey && !in.IsText())) {
+        in.Read(out);
+        if (m_names && out != 0 && !m_names->HasKey(kind, out)) FailRef(in, kind);
         return;
     }
     std::string name;
-    member.Read(name);
+    in.Read(name);
     const std::optional<int> found = m_names->KeyOf(kind, name);
-    if (!found) FailRef(member, kind);
+    if (!found) FailRef(in, kind);
     out = found.value_or(0);
+}
+
+void CCaseGet::Refs(const char* key, std::vector<int>& out, RECORD_KIND kind)
+{
+    out.clear();
+    if (!Has(key)) return;
+    m_in.Member(key).ForEachItem([&](CJsonReader& item, std::size_t) {
+        ReadRef(item, out.emplace_back(), kind, true);
+        if (m_names && !m_names->HasKey(kind, out.back())) FailRef(item, kind);
+    });
 }
 
 void CCaseGet::KeyRef(const char* key, int& out, RECORD_KIND kind)

@@ -137,7 +137,11 @@ public:
         Opt(key, out, 0);
         if (out != 0) KeyRef(key, out, kind);
     }
+    void FreeKeyRef(const char* key, int& out, RECORD_KIND) { Need(key, out); }
+    /// Names or keys; in the model file keys.
+    void Refs(const char* key, std::vector<int>& out, RECORD_KIND kind);
     void NameRef(const char* key, std::string& out, RECORD_KIND) { Need(key, out); }
+    void OptNameRef(const char* key, std::string& out, RECORD_KIND) { Opt(key, out, {}); }
     void NameRefs(const char* key, std::vector<std::string>& out, RECORD_KIND) { Texts(key, out); }
     /// One node or two; `reason` when there are others.
     void NodePair(const char* key, int& nodeI, int& nodeJ, std::size_t count, const char* reason);
@@ -287,6 +291,13 @@ public:
         m_in.Member(key).ForEachItem(
             [&](CJsonReader& item, std::size_t) { Nested(item, all.emplace_back(), context...); });
     }
+    template <class R, class... C>
+    void ListIf(const char* key, std::optional<std::vector<R>>& all, const C&... context)
+    {
+        if (m_in.Has(key)) all.emplace();
+        if (all) return List(key, *all, context...);
+        m_keys.emplace_back(key);
+    }
     /// Up to N numbers; the rest is 0.
     template <std::size_t N>
     void Padded(const char* key, std::array<double, N>& out, T_DIM dim)
@@ -337,6 +348,8 @@ private:
             key, ids, [&](int id) { return seen.insert(id).second; }, twice);
     }
     static void FailRef(CJsonReader& in, RECORD_KIND kind);
+    /// A name, or where it may be one, a key.
+    void ReadRef(CJsonReader& in, int& out, RECORD_KIND kind, bool mayBeKey) const;
 
     /// A missing member becomes a fault at the end: a wrong spelling is told first.
     bool Take(const char* key)

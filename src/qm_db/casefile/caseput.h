@@ -21,7 +21,7 @@ constexpr bool kIsOneLine =
     kIsAnyOf<R, T_NODE_D, T_ELEM_D, T_MATL_D, T_EQDS_D, T_ULFC_D, T_REBAR, T_SECT_FACTORS,
              T_NODAL_LOAD, T_BEAM_LOAD, T_SETTLEMENT, T_TEMPERATURE_LOAD, T_PTNS_D, T_LCOM_ITEM,
              T_ULFI_UNKNOWN, T_STAG_LOAD, T_ULSI_ROW, T_SKEL_POINT, T_SIDES<double>, T_POLC_PATTERN,
-             T_POVR_D, T_SPFC_NTC_STATE, T_EVAL_BILINEAR>;
+             T_PUSH_INITIAL_LOAD, T_PUSH_STOPS_D, T_POVR_D, T_SPFC_NTC_STATE, T_EVAL_BILINEAR>;
 
 class CCasePut {
 public:
@@ -119,7 +119,23 @@ public:
     }
     void KeyRef(const char* key, int target, RECORD_KIND) { Need(key, target); }
     void OptKeyRef(const char* key, int target, RECORD_KIND) { Opt(key, target, 0); }
+    void FreeKeyRef(const char* key, int target, RECORD_KIND) { Need(key, target); }
+    void Refs(const char* key, const std::vector<int>& targets, RECORD_KIND kind)
+    {
+        if (!m_names) return OptNodes(key, targets);
+        std::vector<std::string> names;
+        for (const int target : targets) {
+            const std::string* const name = m_names->NameOf(kind, target);
+            if (!name) return m_out.Fail("IDS_QM_CASE_NO_NAME_OF_KEY", std::to_string(target));
+            names.push_back(*name);
+        }
+        Texts(key, names);
+    }
     void NameRef(const char* key, const std::string& target, RECORD_KIND) { Need(key, target); }
+    void OptNameRef(const char* key, const std::string& target, RECORD_KIND)
+    {
+        Opt(key, target, {});
+    }
     void NameRefs(const char* key, const std::vector<std::string>& targets, RECORD_KIND)
     {
         Texts(key, targets);
@@ -257,16 +273,12 @@ public:
     template <class R, class... C>
     void List(const char* key, const std::vector<R>& all, const C&... context)
     {
-        if (all.empty()) return;
-        Begin(key);
-        m_out.BeginArray();
-        for (const R& r : all) {
-            m_out.BeginObject(kIsOneLine<R>);
-            CCasePut item(m_out, m_names);
-            CaseFields(item, r, context...);
-            m_out.EndObject();
-        }
-        m_out.EndArray();
+        if (!all.empty()) WriteList(key, all, context...);
+    }
+    template <class R, class... C>
+    void ListIf(const char* key, const std::optional<std::vector<R>>& all, const C&... context)
+    {
+        if (all) WriteList(key, *all, context...);
     }
     template <std::size_t N>
     void Padded(const char* key, const std::array<double, N>& values, T_DIM dim)
@@ -305,6 +317,20 @@ private:
     static bool Same(const T& a, const T& b)
     {
         return a == b;
+    }
+
+    template <class R, class... C>
+    void WriteList(const char* key, const std::vector<R>& all, const C&... context)
+    {
+        Begin(key);
+        m_out.BeginArray();
+        for (const R& r : all) {
+            m_out.BeginObject(kIsOneLine<R>);
+            CCasePut item(m_out, m_names);
+            CaseFields(item, r, context...);
+            m_out.EndObject();
+        }
+        m_out.EndArray();
     }
 
     void WriteName(const char* key, int index, std::span<const char* const> names)

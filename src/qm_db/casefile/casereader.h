@@ -17,9 +17,10 @@ struct T_CASE_FOLDER {
 void ReadCase(CJsonReader& root, const T_CASE_FOLDER& folder, T_MODEL_CONTENT& content);
 
 class CCaseNames;
-/// What a load case has beside its own members: results of another solver, limit-state steps.
+/// What a load case has beside its own members: results of another solver or the number of
+/// increments, limit-state steps.
 void ReadSteps(CJsonReader& in, const CCaseNames& names, const T_CASE_FOLDER& folder, int key,
-               const T_POLC_D& push, T_MODEL_CONTENT& content);
+               T_POLC_D& push, T_MODEL_CONTENT& content);
 /// References by name, and rules of the record.
 void JudgeEvaluation(CJsonReader& in, const T_MODEL& model, const T_EVAL_D& eval);
 

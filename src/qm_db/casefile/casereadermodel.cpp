@@ -54,6 +54,7 @@ void CheckKeys(CJsonReader& root)
     CKeysOf known;
     known.Key("format");
     CaseFields(known, T_STYP_D{});
+    known.Key(kPushControlMember);
     ForEachKind([&](const auto& row) {
         if (row.member) known.Key(row.member);
     });
@@ -92,9 +93,13 @@ private:
     }
     void Read(const T_RECORD_ROW<T_POLC_D>& row)
     {
+        if (m_root.Has(kPushControlMember)) {
+            CJsonReader control = m_root.Member(kPushControlMember);
+            CCaseGet::Record(control, m_model.styp.units, m_names, {}, m_model.pushControl);
+        }
         constexpr const char* kMore[] = {"steps", "limit_state_steps"};
         ReadTable(m_root, m_names, row, m_model, kMore,
-                  [&](CJsonReader& in, int key, const T_POLC_D& push) {
+                  [&](CJsonReader& in, int key, T_POLC_D& push) {
                       ReadSteps(in, m_names, m_folder, key, push, m_content);
                   });
     }

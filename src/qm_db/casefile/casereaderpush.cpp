@@ -31,12 +31,15 @@ void CheckPattern(CJsonReader in, const T_MODEL& model, const T_POLC_D& push)
 } // namespace
 
 void ReadSteps(CJsonReader& in, const CCaseNames& names, const T_CASE_FOLDER& folder, int key,
-               const T_POLC_D& push, T_MODEL_CONTENT& content)
+               T_POLC_D& push, T_MODEL_CONTENT& content)
 {
     T_MODEL& model = content.model;
     in.Check("control_node", model.nodes.contains(push.controlNode), "IDS_QM_CASE_NO_NODE");
     CheckPattern(in.Member("pattern"), model, push);
-    if (in.Has("steps") || !push.control) { // a case with "control" may still have to be run
+    if (push.control && in.Has("steps") && in.Member("steps").IsNumber()) {
+        if (push.steps) in.FailAt("steps", "IDS_QM_CASE_SAME_AS", kIncrementsKey);
+        in.Get("steps", push.steps);
+    } else if (in.Has("steps") || !push.control) { // a case with "control" may still have to be run
         T_PUSH_DATA data;
         CJsonReader steps = in.Member("steps");
         ReadSteps(steps, folder, model, push, data);

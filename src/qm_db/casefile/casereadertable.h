@@ -29,6 +29,11 @@ public:
         Key(key);
     }
     template <class... A>
+    void ListIf(const char* key, const A&...)
+    {
+        Key(key);
+    }
+    template <class... A>
     void Group(const char* key, const A&...)
     {
         Key(key);
@@ -57,9 +62,7 @@ void ReadRecord(CJsonReader& item, const CCaseNames& names, const T_UNITS& units
     // An unknown key is told before anything else, a number out of range after everything.
     constexpr bool kWhole =
         std::is_same_v<R, T_NODE_D> || std::is_same_v<R, T_STOR_D> || std::is_same_v<R, T_EIGV_D>;
-    // A load pattern may name a static load case that is not there.
-    constexpr bool kByRules = !std::is_same_v<R, T_POLC_D>;
-    CCaseGet get(item, kWhole ? kSiUnits : units, {}, kByRules ? &names : nullptr);
+    CCaseGet get(item, kWhole ? kSiUnits : units, {}, &names);
     for (const char* const key : more)
         (void)get.Has(key);
     if (row.key == CASE_KEY::Stated) (void)get.Has("key");

@@ -12,19 +12,36 @@ template <class R>
 void WriteMore(CJsonWriter&, const T_MODEL_CONTENT&, int, const R&)
 {
 }
-void WriteMore(CJsonWriter& out, const T_MODEL_CONTENT& content, int key, const T_POLC_D& push)
+bool HasSteps(const T_MODEL_CONTENT& content, int key)
 {
     const auto it = content.results.find(key);
-    const bool hasSteps = it != content.results.end() && it->second && it->second->StepCount() > 0;
+    return it != content.results.end() && it->second && it->second->StepCount() > 0;
+}
+void WriteMore(CJsonWriter& out, const T_MODEL_CONTENT& content, int key, const T_POLC_D& push)
+{
+    const bool hasSteps = HasSteps(content, key);
+    if (!hasSteps && push.control && push.steps) out.Member("steps", *push.steps);
     if (hasSteps || !push.control) out.Key("steps");
     if (hasSteps)
-        WriteSteps(out, *it->second, push.direction);
+        WriteSteps(out, *content.results.at(key), push.direction);
     else if (!push.control)
         out.Fail("IDS_QM_CASE_NO_RESULTS", push.name);
     const auto steps = content.model.poverSteps.find(key);
     if (out.Failed() || steps == content.model.poverSteps.end()) return;
     CCasePut put(out);
     put.NeedPart("limit_state_steps", steps->second);
+}
+
+/// The members that stand under their own keys.
+template <class R>
+const R& OwnMembers(const T_MODEL_CONTENT&, int, const R& record)
+{
+    return record;
+}
+T_POLC_D OwnMembers(const T_MODEL_CONTENT& content, int key, T_POLC_D push)
+{
+    if (push.control && !HasSteps(content, key)) push.steps.reset(); // they are in "steps"
+    return push;
 }
 
 template <class R>
@@ -52,7 +69,7 @@ void WriteTable(CJsonWriter& out, const CCaseNames& names, const T_RECORD_ROW<R>
         if (row.key == CASE_KEY::Stated && key != next) out.Member("key", key);
         if constexpr (kHasName<R>) WriteName(out, record, taken, row.key);
         CCasePut put(out, &names);
-        CaseFields(put, record);
+        CaseFields(put, OwnMembers(content, key, record));
         WriteMore(out, content, key, record);
         out.EndObject();
         // The place of a mode in the array is its number, which load patterns name.
@@ -74,6 +91,7 @@ void WriteCase(CJsonWriter& out, const T_MODEL_CONTENT& content)
     HeadFields(model, content.model.styp);
     ForEachKind([&]<class R>(const T_RECORD_ROW<R>& row) {
         if (std::is_same_v<R, T_MATL_D>) OptionFields(model, content.model.styp);
+        if (std::is_same_v<R, T_POLC_D>) model.Part(kPushControlMember, content.model.pushControl);
         WriteTable(out, names, row, content);
     });
     out.EndObject();

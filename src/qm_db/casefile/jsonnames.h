@@ -4,6 +4,7 @@
 #include "qm_db/records/evalnames.h"
 
 inline constexpr const char* kCaseFormat = "qm-rps case 1";
+inline constexpr const char* kPushControlMember = "pushover_control";
 inline constexpr const char* kStateBeforePush = "state before push";
 
 /// Dimension of the displacements and of the base reactions of a load case (direction 1 to 6).

@@ -100,6 +100,7 @@ public:
     void ForEachItem(F&& f);
     template <class F>
     void ForEachNode(F&& f);
+    bool IsNumber() const { return m_value && std::holds_alternative<double>(m_value->data); }
     bool IsText() const { return m_value && std::holds_alternative<std::string>(m_value->data); }
 
 private:

@@ -1,4 +1,5 @@
-// Names of the case file for units, spectra and evaluations, in the order of their numbers.
+// Names of the case file for units, pushover analysis, spectra and evaluations, in the order of
+// their numbers.
 #pragma once
 
 #include "qm_db/records.h"
@@ -9,6 +10,12 @@
 inline constexpr std::array<const char*, 7> kForceNames{"N",    "kN",  "MN",  "kgf",
                                                         "tonf", "lbf", "kips"};
 inline constexpr std::array<const char*, 5> kLengthNames{"mm", "cm", "m", "in", "ft"};
+
+/// By PUSH_P_DELTA, PUSH_FAILURE, PUSH_FLOW and PUSH_STATE_STOP.
+inline constexpr std::array<const char*, 3> kPDeltaNames{"none", "initial", "updated"};
+inline constexpr std::array<const char*, 2> kPushFailureNames{"drop", "stop"};
+inline constexpr std::array<const char*, 2> kPushFlowNames{"rotations", "associated"};
+inline constexpr std::array<const char*, 3> kStateStopNames{"LS", "CP", "failed"};
 
 /// In the order of the alternatives of T_SPFC_D::data.
 inline constexpr std::array<const char*, 5> kSpectrumKinds{"atc40", "ec8-2004", "ec8-1994", "ntc",

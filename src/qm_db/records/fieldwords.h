@@ -9,14 +9,16 @@
 // Texts: as their types say. NodeTable: numbers by node. Flags: the names of the flags that are
 // set. Enum, EnumOpt, EnumIf: a name out of a list. Code: the same, other numbers stay numbers.
 // Letter, LetterIf, WordIf: a text out of a list. Variant: the name of the alternative. Part: a
-// nested record, left out when it has nothing to say; NeedPart, PartIf, List: as they say. Group:
+// nested record, left out when it has nothing to say; NeedPart, PartIf, List, ListIf: as they say;
+// ListIf: an empty list says something, too. Group:
 // members that stand together in the case file; NeedGroup: even when none is there. NeedRef,
 // OptRef: another record, by name in a case file and by key in the model file. KeyRef, OptKeyRef:
-// by key in both. NameRef, NameRefs: by name in both. Node, Element, NodePair, NodeList, OptNodes,
-// OptElements: ids that must be there. StageStep: a step of a stage.
-// Check, CheckEach: a rule of the case file for a member; SameCount: a list is as long as another.
-// They are asked of a whole model, too (modelfault.h). Rule: one of every file. What a rule says
-// when it is broken, and what a list offers, are keys of the message catalogue.
+// by key in both; FreeKeyRef: to one that may be missing. NameRef, OptNameRef, NameRefs: by name in
+// both. Refs: a list of other records, by name and by key. Node, Element, NodePair, NodeList,
+// OptNodes, OptElements: ids that must be there. StageStep: a step of a stage. Check, CheckEach: a
+// rule of the case file for a member; SameCount: a list is as long as another. They are asked of a
+// whole model, too (modelfault.h). Rule: one of every file. What a rule says when it is broken, and
+// what a list offers, are keys of the message catalogue.
 #pragma once
 
 #include "qm_db/records/evalnames.h"
@@ -47,6 +49,9 @@ public:
     {
         Me().Key(key);
         if constexpr (std::is_same_v<std::remove_const_t<T>, double>) Me().Number(value, dim);
+        if constexpr (std::is_same_v<std::remove_const_t<T>, std::vector<double>>)
+            for (auto& number : value)
+                Me().Number(number, dim);
     }
     template <class T>
     void Opt(const char* key, T& value, const std::remove_const_t<T>&, T_DIM dim = kDimNone)
@@ -97,10 +102,22 @@ public:
     }
     void KeyRef(const char* key, int target, RECORD_KIND kind) { NeedRef(key, target, kind); }
     void OptKeyRef(const char* key, int target, RECORD_KIND kind) { NeedRef(key, target, kind); }
+    void FreeKeyRef(const char* key, int target, RECORD_KIND kind) { NeedRef(key, target, kind); }
+    void Refs(const char* key, const std::vector<int>& targets, RECORD_KIND kind)
+    {
+        Me().Key(key);
+        for (const int target : targets)
+            NeedRef(key, target, kind);
+    }
     void NameRef(const char* key, const std::string& target, RECORD_KIND kind)
     {
         Me().Key(key);
         Me().Reference(kind, target);
+    }
+    void OptNameRef(const char* key, const std::string& target, RECORD_KIND kind)
+    {
+        Me().Key(key);
+        if (!target.empty()) NameRef(key, target, kind);
     }
     void NameRefs(const char* key, const std::vector<std::string>& targets, RECORD_KIND kind)
     {
@@ -153,6 +170,12 @@ public:
         Me().Key(key);
         for (auto& r : all)
             CaseFields(Me(), r, context...);
+    }
+    template <class R, class... C>
+    void ListIf(const char* key, R& all, const C&... context)
+    {
+        Me().Key(key);
+        if (all) List(key, *all, context...);
     }
     template <class F>
     void Group(const char* key, const F& members)

@@ -100,6 +100,12 @@ public:
             Inside(std::string(key) + '[' + std::to_string(i) + "].",
                    [&] { CaseFields(*this, all[i], context...); });
     }
+    template <class R, class... C>
+    void ListIf(const char* key, const std::optional<std::vector<R>>& all, const C&... context)
+    {
+        if (!all) return Leave(key);
+        List(key, *all, context...);
+    }
     template <class F>
     void Group(const char* key, const F& members)
     {
@@ -286,6 +292,9 @@ std::string ModelFault(const T_MODEL& model)
     CFieldJudge head;
     CaseFields(head, model.styp);
     all.Take(head, "model");
+    CFieldJudge control;
+    CaseFields(control, model.pushControl);
+    all.Take(control, "pushover_control");
     ForEachKind(all);
     return all.Fault();
 }

@@ -6,14 +6,43 @@
 
 #include <utility>
 
-// ---- pushover load cases ------------------------------------------------------------------------
+// ---- global control and pushover load cases -----------------------------------------------------
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_PUSH_INITIAL_LOAD> r)
+{
+    v.NeedRef("case", r.loadCase, KindOf<T_STLD_D>());
+    v.Opt("factor", r.factor, 1.0);
+}
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_POGC_D> r)
+{
+    static const T_POGC_D d;
+    v.List("initial_loads", r.initialLoads);
+    v.EnumOpt("p_delta", r.pDelta, d.pDelta, kPDeltaNames, "IDS_QM_CHOICE_P_DELTA");
+    v.Opt("steps", r.steps, d.steps);
+    v.EnumOpt("on_failure", r.onFailure, d.onFailure, kPushFailureNames, "IDS_QM_CHOICE_FAILURE");
+    v.EnumOpt("flow", r.flow, d.flow, kPushFlowNames, "IDS_QM_CHOICE_FLOW");
+    v.Refs("hinge_types", r.hingeTypes, KindOf<T_PHGT_D>());
+    v.Opt("most_events", r.mostEvents, d.mostEvents);
+    v.Opt("most_steps", r.mostSteps, d.mostSteps);
+}
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_PUSH_STOPS_D> r)
+{
+    v.OptIf("drift", r.drift);
+    v.EnumIf("state", r.state, kStateStopNames, "IDS_QM_CHOICE_STATE");
+    v.OptIf("fraction_of_peak", r.fractionOfPeak);
+}
 
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_POLC_PATTERN> r)
 {
     v.Enum("kind", r.kind, kPatternNames, "IDS_QM_CHOICE_PATTERN");
     if (r.kind == 0)
-        v.KeyRef("number", r.number, KindOf<T_STLD_D>());
+        v.FreeKeyRef("number", r.number, KindOf<T_STLD_D>());
     else
         v.Need("number", r.number);
     v.Opt("factor", r.factor, 1.0);
@@ -34,6 +63,9 @@ void CaseFields(V& v, T_FIELD_REF<V, T_POLC_CONTROL> r)
     v.Opt("max_trans_displ", r.maxTransDispl, d.maxTransDispl, kDimLength);
 }
 
+/// A case file has them in "steps" where no results of another solver stand there.
+inline constexpr const char* kIncrementsKey = "increments";
+
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_POLC_D> r)
 {
@@ -46,6 +78,15 @@ void CaseFields(V& v, T_FIELD_REF<V, T_POLC_D> r)
     v.List("patterns", r.patterns);
     v.PartIf("control", r.control);
     v.Opt("control_option", r.controlOption, 1);
+    v.ListIf("initial_loads", r.initialLoads);
+    v.OptNameRef("initial_case", r.initialCase, KindOf<T_POLC_D>());
+    v.EnumIf("p_delta", r.pDelta, kPDeltaNames, "IDS_QM_CHOICE_P_DELTA");
+    v.OptIf(kIncrementsKey, r.steps);
+    v.EnumIf("on_failure", r.onFailure, kPushFailureNames, "IDS_QM_CHOICE_FAILURE");
+    v.Part("stops", r.stops);
+    v.Opt("eccentricity", r.eccentricity, 0.0);
+    v.Opt("additional_displacements", r.additionalDisplacements, {}, kDimLength);
+    v.Opt("additional_evaluations", r.additionalEvaluations, false);
 }
 
 /// They stand in the load case that they belong to.

@@ -7,6 +7,7 @@
 #include "qm_db/records/stagefields.h"
 
 #include <algorithm>
+#include <limits>
 
 namespace {
 
@@ -36,7 +37,7 @@ private:
 
 int PlaceOf(RECORD_KIND kind)
 {
-    int place = 0;
+    int place = std::numeric_limits<int>::max();
     WithKind(kind, [&](const auto& row) { place = row.place; });
     return place;
 }
@@ -56,12 +57,17 @@ T_RECORD_USERS UsersOf(const T_MODEL& model, RECORD_KIND kind, int key)
             if (look.IsFound()) users.push_back({KindOf<R>(), k});
         }
     });
+    CRefersTo control(kind, key, name);
+    CaseFields(control, model.pushControl);
+    if (control.IsFound()) users.push_back({kPushControlKind, 0});
     std::ranges::stable_sort(users, {}, [](const T_RECORD_USER& u) { return PlaceOf(u.kind); });
     return users;
 }
 
 std::string DescribeUser(const T_MODEL& model, const T_RECORD_USER& user)
 {
+    if (user.kind == kPushControlKind)
+        return zql::lib::MMSGFunction::GetValue("IDS_QM_DB_USER_PUSH_CONTROL");
     const std::string* const name = CCaseNames(model).NameOf(user.kind, user.key);
     const std::string which = name ? '"' + *name + '"' : std::to_string(user.key);
     std::string text;

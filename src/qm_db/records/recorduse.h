@@ -11,6 +11,8 @@ struct T_RECORD_USER {
     int key = 0; // of the record that refers
     bool operator==(const T_RECORD_USER&) const = default;
 };
+/// As a user: the global control of the pushover analysis, whose key is 0.
+inline constexpr RECORD_KIND kPushControlKind{std::tuple_size_v<decltype(kRecords)>};
 using T_RECORD_USERS = std::vector<T_RECORD_USER>;
 
 /// The users of a record: kind by kind, keys ascending, each once. Constraints of unknown load

@@ -9,7 +9,8 @@
 
 namespace {
 
-constexpr const char* kModel = "model"; // its one record has the key 1
+constexpr const char* kModel = "model";                  // its one record has the key 1
+constexpr const char* kPushControl = "pushover_control"; // likewise; text alone
 
 /// Records that share packed lists, and have no row.
 template <class R>
@@ -42,6 +43,14 @@ void WriteTexts(const T_RECORD_ROW<R>& kind, const T_MODEL& model, CPackedArrays
     }
 }
 
+void WritePushControl(const T_MODEL& model, CPackedArrays& arrays)
+{
+    if (model.pushControl == T_POGC_D()) return;
+    CRecordRow row(kPushControl, 1);
+    CRowPut put(row, arrays, CTablePlaces(std::string_view(kPushControl)));
+    RowFields(put, model.pushControl);
+}
+
 template <class R>
 void WriteRows(const CSqliteDb& db, const T_RECORD_ROW<R>& kind, const T_MODEL& model,
                CPackedArrays& arrays)
@@ -63,6 +72,16 @@ void ReadTexts(const T_RECORD_ROW<R>& kind, const CPackedArrays& arrays, T_MODEL
         if (isNew == kIsPacked<R>) row.ThrowBadCell("key");
         CRowGet get(row, arrays, places);
         RowFields(get, table.at(static_cast<int>(key)));
+    }
+}
+
+void ReadPushControl(const CPackedArrays& arrays, T_MODEL& model)
+{
+    for (const std::int64_t key : arrays.Keys(TextOwner(kPushControl))) {
+        const CRecordRow row(kPushControl, key);
+        if (key != 1) row.ThrowBadCell("key");
+        CRowGet get(row, arrays, CTablePlaces(std::string_view(kPushControl)));
+        RowFields(get, model.pushControl);
     }
 }
 
@@ -99,6 +118,7 @@ void WriteModel(const CSqliteDb& db, const T_MODEL& model)
     ForEachKind([&](const auto& kind) {
         if (!HasTable(kind.store)) WriteTexts(kind, model, arrays);
     });
+    WritePushControl(model, arrays);
     arrays.Write(db);
 }
 
@@ -124,5 +144,6 @@ T_MODEL ReadModel(const CSqliteDb& db, T_TABLE_SUMS& sums)
     ForEachKind([&](const auto& kind) {
         if (!HasTable(kind.store)) ReadTexts(kind, arrays, model);
     });
+    ReadPushControl(arrays, model);
     return model;
 }

@@ -132,6 +132,16 @@ public:
         if (!Me().Cell(key, target)) Me().Body().NameRef(key, target, kind);
     }
     template <class T>
+    void OptNameRef(const char* key, T& target, RECORD_KIND kind)
+    {
+        if (!Me().Cell(key, target)) Me().Body().OptNameRef(key, target, kind);
+    }
+    template <class T>
+    void Refs(const char* key, T& targets, RECORD_KIND kind)
+    {
+        if (!Me().Cell(key, targets)) Me().Body().Refs(key, targets, kind);
+    }
+    template <class T>
     void NameRefs(const char* key, T& targets, RECORD_KIND kind)
     {
         Me().Body().NameRefs(key, targets, kind);
@@ -215,6 +225,11 @@ public:
     void List(const char* key, R& all, const C&... context)
     {
         Me().Body().List(key, all, context...);
+    }
+    template <class R, class... C>
+    void ListIf(const char* key, R& all, const C&... context)
+    {
+        Me().Body().ListIf(key, all, context...);
     }
     template <class F>
     void Group(const char* key, const F& members)
