@@ -38,7 +38,8 @@ int CPO_LoadCaseDlg::Dlg2Data(T_POLC_D& data)
 std::vector<T_FINDING> CPO_LoadCaseDlg::Findings() const
 {
     static const T_MODEL none;
-    std::vector<T_FINDING> out = LoadCaseFindings(m_case, Doc() ? Doc()->Data().Model() : none);
+    std::vector<T_FINDING> out =
+        LoadCaseFindings(m_case, Doc() ? Doc()->Data().Model() : none, m_key);
     const auto append = [&out](const std::vector<T_FINDING>& found) {
         out.insert(out.end(), found.begin(), found.end());
     };

@@ -1,6 +1,7 @@
 #include "qm_db/casefile/casereadertable.h"
 #include "qm_db/casefile/jsonnames.h"
 #include "qm_db/records/lcomflatten.h"
+#include "qm_db/records/pushcontrol.h"
 
 namespace {
 
@@ -96,11 +97,25 @@ private:
         if (m_root.Has(kPushControlMember)) {
             CJsonReader control = m_root.Member(kPushControlMember);
             CCaseGet::Record(control, m_model.styp.units, m_names, {}, m_model.pushControl);
+            JudgePushControl(control, m_model.pushControl);
         }
         constexpr const char* kMore[] = {"steps", "limit_state_steps"};
         ReadTable(m_root, m_names, row, m_model, kMore,
                   [&](CJsonReader& in, int key, T_POLC_D& push) {
                       ReadSteps(in, m_names, m_folder, key, push, m_content);
+                  });
+        auto push = m_model.pushovers.begin(); // a case may start from the end of a later one
+        ForEachRecord(m_root, row.member, [&](CJsonReader& item, std::size_t) {
+            JudgePush(item, m_model, (push++)->second);
+        });
+    }
+    void Read(const T_RECORD_ROW<T_POFC_D>& row)
+    {
+        ReadTable(m_root, m_names, row, m_model, {},
+                  [](CJsonReader& in, int, const T_POFC_D& function) {
+                      for (const char* const key : {"step", "factor"})
+                          if (const char* const reason = IncrementFunctionFault(function, key))
+                              in.FailAt(key, reason);
                   });
     }
     void Read(const T_RECORD_ROW<T_POVR_D>&) {}

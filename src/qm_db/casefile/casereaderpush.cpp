@@ -1,5 +1,6 @@
 #include "qm_db/casefile/casereadertable.h"
 #include "qm_db/records/loadcaserules.h"
+#include "qm_db/records/pushcontrol.h"
 
 namespace {
 
@@ -28,7 +29,43 @@ void CheckPattern(CJsonReader in, const T_MODEL& model, const T_POLC_D& push)
         "modes", push.modes, [&](int m) { return model.modes.contains(m); }, "IDS_QM_CASE_NO_MODE");
 }
 
+void Judge(CJsonReader& in, const char* key, const char* reason)
+{
+    if (reason) in.FailAt(key, reason);
+}
+
+void JudgeInitialLoads(CJsonReader& in, const std::vector<T_PUSH_INITIAL_LOAD>& loads)
+{
+    if (loads.empty()) return;
+    in.Member("initial_loads").ForEachItem([&](CJsonReader& item, std::size_t i) {
+        Judge(item, "factor", InitialLoadFault(loads[i], "factor"));
+    });
+}
+
 } // namespace
+
+void JudgePushControl(CJsonReader& in, const T_POGC_D& control)
+{
+    JudgeInitialLoads(in, control.initialLoads);
+    for (const char* const key : {"steps", "most_events", "most_steps"})
+        Judge(in, key, PushControlFault(control, key));
+}
+
+void JudgePush(CJsonReader& in, const T_MODEL& model, const T_POLC_D& push)
+{
+    if (push.initialLoads) JudgeInitialLoads(in, *push.initialLoads);
+    for (const char* const key : {"initial_case", "eccentricity"})
+        Judge(in, key, LoadCaseFault(push, model, key));
+    Judge(in, in.Has(kIncrementsKey) ? kIncrementsKey : "steps",
+          LoadCaseFault(push, model, "steps"));
+    in.CheckEach(
+        "additional_displacements", push.additionalDisplacements,
+        [&](double d) { return IsOnTheWay(push, d); }, "IDS_QM_PUSH_ADDITIONAL");
+    if (!in.Has("stops")) return;
+    CJsonReader stops = in.Member("stops");
+    for (const char* const key : {"drift", "fraction_of_peak"})
+        Judge(stops, key, LoadCaseFault(push, model, key));
+}
 
 void ReadSteps(CJsonReader& in, const CCaseNames& names, const T_CASE_FOLDER& folder, int key,
                T_POLC_D& push, T_MODEL_CONTENT& content)

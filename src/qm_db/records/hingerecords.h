@@ -230,7 +230,8 @@ struct T_IEHP_D {
     bool operator==(const T_IEHP_D&) const = default;
 };
 
-/// Increment function of a pushover load case: load factor over step, both rising.
+/// Increment function of a pushover load case: fraction of its load (of its displacement, where
+/// that is controlled) over step, both rising; a first row of zeros says nothing.
 struct T_POFC_D {
     std::string name;
     std::vector<double> step, factor;

@@ -1,7 +1,6 @@
 #include "qm_rps/pushover/loadcasedocrules.h"
 
 #include "qm_base/ruletable.h"
-#include "qm_db/recordfacts.h"
 
 namespace {
 
@@ -28,21 +27,6 @@ constexpr T_RULE<T_IN_DOC> kRules[] = {
      [](const T_IN_DOC& d) { return !d.results; }},
 };
 
-struct T_IN_MODEL {
-    const T_MODEL& model;
-    const T_POLC_PATTERN& row;
-};
-
-constexpr int kStatic = 0;
-constexpr T_RULE<T_IN_MODEL> kRowRules[] = {
-    {{.message = "IDS_QM_UI_POLC_NO_MODE"},
-     [](const T_IN_MODEL& r) { return r.model.modes.contains(r.row.number); },
-     [](const T_IN_MODEL& r) { return IsModePattern(r.row.kind) && !r.model.modes.empty(); }},
-    {{.message = "IDS_QM_UI_POLC_NO_CASE"},
-     [](const T_IN_MODEL& r) { return r.model.loadCases.contains(r.row.number); },
-     [](const T_IN_MODEL& r) { return r.row.kind == kStatic && !r.model.loadCases.empty(); }},
-};
-
 } // namespace
 
 bool HasPushResults(CDBDoc& doc, int key)
@@ -54,14 +38,5 @@ std::vector<T_FINDING> LoadCaseDocFindings(CDBDoc& doc, int key, const T_POLC_D&
 {
     std::vector<T_FINDING> out;
     WalkRules(kRules, {doc, key, record, HasPushResults(doc, key)}, {}, out);
-    return out;
-}
-
-std::vector<T_FINDING> PatternDocFindings(const T_MODEL& model,
-                                          const std::vector<T_POLC_PATTERN>& rows)
-{
-    std::vector<T_FINDING> out;
-    for (std::size_t i = 0; i < rows.size(); ++i)
-        WalkRules(kRowRules, {model, rows[i]}, {.prefix = PatternField(i)}, out);
     return out;
 }

@@ -11,8 +11,3 @@ bool HasPushResults(CDBDoc& doc, int key);
 /// Rules of the document that the record under this key (0: a new one) does not keep: free name,
 /// existing node, node with results, control data where there are none.
 std::vector<T_FINDING> LoadCaseDocFindings(CDBDoc& doc, int key, const T_POLC_D& record);
-
-/// Modes and static load cases that the pattern rows name and the model does not have. A model
-/// without any of its own names those of another solver.
-std::vector<T_FINDING> PatternDocFindings(const T_MODEL& model,
-                                          const std::vector<T_POLC_PATTERN>& rows);
