@@ -39,6 +39,22 @@ void CDataCtrl::SetStaticResult(int loadCase, std::shared_ptr<IStaticResult> res
     ++m_revision;
 }
 
+void CDataCtrl::SetPushResult(int pushover, std::shared_ptr<IPushResult> result, int turn)
+{
+    const auto put = [&](auto& map, const auto& key) {
+        if (result)
+            map[key] = std::move(result);
+        else
+            map.erase(key);
+    };
+    if (turn == 0)
+        put(m_content.results, pushover);
+    else
+        put(m_content.turnedResults, std::pair(pushover, turn));
+    ChangeForGood();
+    ++m_revision;
+}
+
 void CDataCtrl::SetStagedResult(std::shared_ptr<IStagedResult> result)
 {
     m_content.stagedResult = std::move(result);

@@ -19,6 +19,10 @@ public:
     /// Replaces or adds the results of one static load case; null removes them.
     void SetStaticResult(int loadCase, std::shared_ptr<IStaticResult> result);
 
+    /// Replaces or adds the results of one pushover load case, whose loads are turned that many
+    /// times by its static angle; null removes them.
+    void SetPushResult(int pushover, std::shared_ptr<IPushResult> result, int turn = 0);
+
     /// Results of the construction stages; null where there are none.
     const std::shared_ptr<IStagedResult>& StagedResult() const { return m_content.stagedResult; }
     void SetStagedResult(std::shared_ptr<IStagedResult> result);

@@ -5,7 +5,7 @@
 
 #include "qm_db/fileerror.h"
 #include "qm_db/records.h"
-#include "qm_db/results/pushresult.h"
+#include "qm_db/results/pushrun.h"
 #include "qm_db/results/stagedresult.h"
 
 #include <cstdint>
@@ -21,6 +21,7 @@ enum class OPEN_MODE {
 struct T_MODEL_CONTENT {
     T_MODEL model;        // SI
     T_RESULT_MAP results; // by the key of the pushover load case; file-backed sources stay lazy
+    T_TURNED_MAP turnedResults{};                  // of pushes with turned loads, likewise
     T_STATIC_MAP staticResults{};                  // by the key of the static load case, likewise
     std::shared_ptr<IStagedResult> stagedResult{}; // of the construction stages, or null; likewise
 };

@@ -122,10 +122,14 @@ int CPostCtrl::CalcEiParticipation(int mode, T_MPAF_D& factor, T_MPAM_D& percent
     return 1;
 }
 
-IPushResult* CPostCtrl::Source() const
+IPushResult* CPostCtrl::SourceOf(int loadCase, int turn) const
 {
-    const auto it = m_data.Content().results.find(m_pushover);
-    return it == m_data.Content().results.end() ? nullptr : it->second.get();
+    const auto in = [](const auto& map, const auto& key) {
+        const auto it = map.find(key);
+        return it == map.end() ? nullptr : it->second.get();
+    };
+    return turn == 0 ? in(m_data.Content().results, loadCase)
+                     : in(m_data.Content().turnedResults, std::pair(loadCase, turn));
 }
 
 int CPostCtrl::Direction() const
@@ -143,15 +147,13 @@ T_DIM CPostCtrl::ReacDim() const
     return Direction() < 3 ? kDimForce : kDimMoment;
 }
 
-int CPostCtrl::SelectPushover(int loadCase)
+int CPostCtrl::SelectPushover(int loadCase, int turn)
 {
-    const int before = m_pushover;
+    if (!SourceOf(loadCase, turn) || !m_data.Model().pushovers.contains(loadCase)) return 0;
+    const bool isSame = m_pushover == loadCase && m_turn == turn;
     m_pushover = loadCase;
-    if (!Source() || !m_data.Model().pushovers.contains(loadCase)) {
-        m_pushover = before;
-        return 0;
-    }
-    if (before != loadCase || m_revision != m_data.Revision()) {
+    m_turn = turn;
+    if (!isSame || m_revision != m_data.Revision()) {
         m_levels.clear(); // they look into the series
         m_series.clear();
         m_factors.clear();

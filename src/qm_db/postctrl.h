@@ -59,8 +59,9 @@ public:
     /// Both from the nodal masses and the shape, whatever is recorded. As above.
     [[nodiscard]] int CalcEiParticipation(int mode, T_MPAF_D& factor, T_MPAM_D& percent) const;
 
-    /// Selects the pushover load case whose steps are read. 1 done; 0 it has no results.
-    [[nodiscard]] int SelectPushover(int loadCase);
+    /// Selects the pushover load case whose steps are read; its run with the loads turned so many
+    /// times by its static angle. 1 done; 0 it has no such results.
+    [[nodiscard]] int SelectPushover(int loadCase, int turn = 0);
     int GetStepCount() const;
     /// Steps count from 1. 1 done; 0 out of range.
     [[nodiscard]] int SelectStep(int step);
@@ -73,6 +74,24 @@ public:
     /// The node with results that has moved most in the control direction at the last step, the
     /// smallest id of several. 1 found; 0 no steps, or not readable (Error), output as it was.
     [[nodiscard]] int FindControlNode(int& node);
+
+    /// The run of our own that the results are of, in SI; null: none, or another solver's results.
+    IPushRun* RunOf(int loadCase, int turn = 0) const;
+    /// Whether the run was computed from something else than the model as it is; `reason` says what
+    /// has changed. Results of another solver never are.
+    bool IsStale(int loadCase, std::string& reason, int turn = 0);
+    /// What the run of the selected load case has beside the values above, in current units (those
+    /// of hinges by their component). 1 done; 0 it has none, no such node, step or hinge, or not
+    /// readable (Error); lists are then empty.
+    [[nodiscard]] int GetRunHead(T_RUN_HEAD& out) const;
+    [[nodiscard]] int GetRunSteps(std::vector<T_RUN_STEP>& out);
+    [[nodiscard]] int GetRunEvents(std::vector<T_RUN_EVENT>& out);
+    [[nodiscard]] int GetRunHinges(std::vector<T_RUN_HINGE>& out);
+    /// A node, or a hinge by its place in the list, over all steps; all of them in one step.
+    [[nodiscard]] int GetRunNode(int node, std::vector<T_DOF6>& out);
+    [[nodiscard]] int GetRunShape(int step, std::vector<T_DOF6>& out);
+    [[nodiscard]] int GetRunHinge(std::size_t hinge, std::vector<T_RUN_STATE>& out);
+    [[nodiscard]] int GetRunStates(int step, std::vector<T_RUN_STATE>& out);
 
     /// A combination of one static load case (by key), for SelectLoadCombNew.
     static T_LCOM_D MakeLoadComb(int loadCase, double factor = 1.0);
@@ -146,7 +165,13 @@ private:
     int ReadCurve();
     int ReadLevels();
     void DeriveParticipation(const T_EIGV_D& mode, T_MPAF_D& factor, T_MPAM_D& percent) const;
-    IPushResult* Source() const;
+    template <class T, class... A>
+    int ReadRun(int (IPushRun::*read)(A..., std::vector<T>&), A... what, std::vector<T>& out);
+    template <class T>
+    void PathToCurrentUnits(T& at) const;
+    void StateToCurrentUnits(T_RUN_STATE& state, int component) const;
+    IPushResult* SourceOf(int loadCase, int turn) const;
+    IPushResult* Source() const { return SourceOf(m_pushover, m_turn); }
     int Direction() const; // 0 to 5
     T_DIM DispDim() const;
     T_DIM ReacDim() const;
@@ -156,9 +181,11 @@ private:
     CStaticReader m_static;
     CStagedReader m_staged;
     int m_mode = 0;
-    int m_pushover = 0;
+    int m_pushover = 0, m_turn = 0;
     int m_step = 0;
     long m_revision = -1; // revision of the data that the caches belong to
+    long m_printsAt = -1;
+    std::map<int, T_RUN_PRINT> m_prints; // of load cases, at that revision of the data
     long m_staticRevisionAt = -1;
     std::uint64_t m_staticRevision = 0; // at that revision of the data
     std::vector<double> m_factors, m_reactions;

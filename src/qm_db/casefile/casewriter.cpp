@@ -12,10 +12,12 @@ template <class R>
 void WriteMore(CJsonWriter&, const T_MODEL_CONTENT&, int, const R&)
 {
 }
+/// Results of another solver; our own are computed again.
 bool HasSteps(const T_MODEL_CONTENT& content, int key)
 {
     const auto it = content.results.find(key);
-    return it != content.results.end() && it->second && it->second->StepCount() > 0;
+    return it != content.results.end() && it->second && !it->second->Run() &&
+           it->second->StepCount() > 0;
 }
 void WriteMore(CJsonWriter& out, const T_MODEL_CONTENT& content, int key, const T_POLC_D& push)
 {

@@ -7,6 +7,8 @@
 #include <string>
 #include <vector>
 
+class IPushRun;
+
 /// What the evaluation reads. A file-backed source reads a node only when it is asked for.
 class IPushResult {
 public:
@@ -22,6 +24,8 @@ public:
     [[nodiscard]] virtual int ReadLoadFactors(std::vector<double>& out) = 0;
     [[nodiscard]] virtual int ReadBaseReactions(std::vector<double>& out) = 0;
     [[nodiscard]] virtual int ReadDisplacements(int node, std::vector<double>& out) = 0;
+    /// The run of our own that these results are of; null: another solver's.
+    virtual IPushRun* Run() { return nullptr; }
     /// Why the last read failed: file, block and reason; empty after a success.
     virtual std::string Error() const { return {}; }
 };

@@ -8,6 +8,7 @@
 #include "qm_db/store/recordcodec.h"
 #include "qm_db/store/resultblocks.h"
 #include "qm_db/store/resultblocksource.h"
+#include "qm_db/store/runblocksource.h"
 #include "qm_db/store/sqlitedb.h"
 #include "qm_db/store/sqlitestmt.h"
 #include "qm_db/store/sqlitetransaction.h"
@@ -161,13 +162,15 @@ CSqliteDb MigratedCopy(const CSqliteDb& db, int version, const T_SCHEMA& schema)
 
 /// Heads can't speak of more numbers than the file has bytes for.
 void CheckSizes(std::int64_t fileSize, const std::vector<T_RESULT_HEAD>& heads,
-                const std::vector<T_STATIC_HEAD>& staticHeads)
+                const std::vector<T_STATIC_HEAD>& staticHeads, const std::vector<T_RUN_ROW>& runs)
 {
     double bytes = 0.0;
     for (const T_RESULT_HEAD& head : heads)
         bytes += BytesOf(head);
     for (const T_STATIC_HEAD& head : staticHeads)
         bytes += BytesOf(head);
+    for (const T_RUN_ROW& run : runs)
+        bytes += BytesOf(run);
     if (bytes > static_cast<double>(fileSize)) ThrowDamaged(kBlockTable);
 }
 
@@ -190,6 +193,7 @@ T_MODEL_CONTENT ReadModelFile(const std::string& path, const T_SCHEMA& schema, C
     const std::vector<T_RESULT_HEAD> heads = ReadResultHeads(*db, found);
     const std::vector<T_STATIC_HEAD> staticHeads = ReadStaticHeads(*db, found);
     const std::vector<T_STAGED_HEAD> stagedHeads = ReadStagedHeads(*db, found);
+    const std::vector<T_RUN_ROW> runs = ReadRunRows(*db, found);
     if (!older) {
         const T_TABLE_SUMS stored = ReadChecksums(*db);
         found[kSchemaTable] = SumOfTable(*db, kSchemaTable);
@@ -201,13 +205,21 @@ T_MODEL_CONTENT ReadModelFile(const std::string& path, const T_SCHEMA& schema, C
     std::vector<T_STATIC_HEAD> all = staticHeads;
     for (const T_STAGED_HEAD& staged : stagedHeads)
         all.push_back(staged.head);
-    CheckSizes(header.fileSize, heads, all);
+    CheckSizes(header.fileSize, heads, all, runs);
     if (whole) {
         CheckBlocks(*db, heads);
         CheckStaticBlocks(*db, all);
+        CheckRunBlocks(*db, runs);
     }
     for (const T_RESULT_HEAD& head : heads)
         content.results[head.pushover] = std::make_shared<CBlockPushResult>(db, path, head);
+    for (const T_RUN_ROW& run : runs) {
+        auto source = std::make_shared<CBlockPushRun>(db, path, run);
+        if (run.head.turn == 0)
+            content.results[run.pushover] = std::move(source);
+        else
+            content.turnedResults[{run.pushover, run.head.turn}] = std::move(source);
+    }
     for (const T_STATIC_HEAD& head : staticHeads)
         content.staticResults[head.loadCase] = std::make_shared<CBlockStaticResult>(db, path, head);
     if (!stagedHeads.empty())
@@ -247,6 +259,7 @@ void WriteModelFile(const std::string& path, const T_MODEL_CONTENT& content)
     CreateSchema(db);
     WriteModel(db, content.model);
     WriteResults(db, content.results);
+    WriteRuns(db, content.model, content.results, content.turnedResults);
     WriteStaticResults(db, content.model, content.staticResults);
     if (content.stagedResult && !content.model.stages.empty())
         WriteStagedResults(db, *content.stagedResult);

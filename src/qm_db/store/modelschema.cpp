@@ -57,6 +57,19 @@ constexpr const char* kVersion4[] = {
     "nodes INTEGER NOT NULL, elements INTEGER NOT NULL, fingerprint INTEGER NOT NULL, "
     "negative_zeros INTEGER NOT NULL) STRICT"};
 
+// Tables that came with version 5.
+constexpr const char* kVersion5[] = {
+    "CREATE TABLE push_results(key INTEGER PRIMARY KEY, pushover INTEGER NOT NULL, "
+    "turn INTEGER NOT NULL, angle REAL NOT NULL, control_x REAL NOT NULL, "
+    "control_y REAL NOT NULL, control_z REAL NOT NULL, control_rx REAL NOT NULL, "
+    "control_ry REAL NOT NULL, control_rz REAL NOT NULL, nodes INTEGER NOT NULL, "
+    "hinges INTEGER NOT NULL, steps INTEGER NOT NULL, events INTEGER NOT NULL, "
+    "turns INTEGER NOT NULL, outcome TEXT NOT NULL, end_stage INTEGER NOT NULL, "
+    "end_load_factor REAL NOT NULL, end_displacement REAL NOT NULL, "
+    "end_element INTEGER NOT NULL, structure_print INTEGER NOT NULL, "
+    "hinge_print INTEGER NOT NULL, load_print INTEGER NOT NULL, setup_print INTEGER NOT NULL, "
+    "negative_zeros INTEGER NOT NULL) STRICT"};
+
 // Scalars are typed columns, quantities in SI. Bit i of negative_zeros says that the i-th column
 // of the row is -0.0: a REAL column stores a whole number as an integer, which has no such value.
 // Every list of numbers (node ids, coordinates, mode shapes, spectrum tables) is a row of "arrays":
@@ -108,7 +121,10 @@ constexpr const char* kTables[] = {
     // one step; of static results 4 ids of 512 nodes, 5 ids of 512 elements, 6 displacements and
     // 7 reactions of the nodes, 8 forces of the elements. pushover is the key of the load case,
     // of a static one from part 4 on. chunk and step count from 0 and are 0 where they mean
-    // nothing; step of a result of construction stages is its key in staged_results, from 1.
+    // nothing; step of a result of construction stages is its key in staged_results, from 1. Of
+    // runs of a push, whose key in push_results stands in pushover: 9 node ids, 10 components of
+    // hinges, 11 steps, 12 events, 13 turns of hinges in them; by 64 and step 14 displacements of
+    // nodes, 15 states of components.
     "CREATE TABLE result_blocks(pushover INTEGER NOT NULL, part INTEGER NOT NULL, "
     "chunk INTEGER NOT NULL, step INTEGER NOT NULL, count INTEGER NOT NULL, "
     "width INTEGER NOT NULL, byte_order TEXT NOT NULL, checksum INTEGER NOT NULL, "
@@ -213,6 +229,13 @@ void MigrateFrom3(const CSqliteDb& db)
         db.Exec(sql);
 }
 
+/// Version 4 had no results of a push of our own.
+void MigrateFrom4(const CSqliteDb& db)
+{
+    for (const char* const sql : kVersion5)
+        db.Exec(sql);
+}
+
 /// Tables of a version, in the order in which it makes them.
 std::vector<std::string> TablesOf(int version)
 {
@@ -220,6 +243,7 @@ std::vector<std::string> TablesOf(int version)
     if (version == 1) all.resize(all.size() - kHingeTables);
     if (version >= 3) all.insert(all.end(), std::begin(kVersion3), std::end(kVersion3));
     if (version >= 4) all.insert(all.end(), std::begin(kVersion4), std::end(kVersion4));
+    if (version >= 5) all.insert(all.end(), std::begin(kVersion5), std::end(kVersion5));
     for (const T_ADDED_COLUMN& added : kAddedColumns) {
         if (version >= added.since) continue;
         const std::string text = std::string(", ") + added.column;
@@ -241,8 +265,8 @@ std::span<const T_MEMBER_PLACE> MemberPlaces()
 const T_SCHEMA& CurrentSchema()
 {
     static constexpr T_MIGRATION kMigrations[] = {
-        {1, MigrateFrom1}, {2, MigrateFrom2}, {3, MigrateFrom3}};
-    static constexpr T_SCHEMA kSchema{4, kMigrations};
+        {1, MigrateFrom1}, {2, MigrateFrom2}, {3, MigrateFrom3}, {4, MigrateFrom4}};
+    static constexpr T_SCHEMA kSchema{5, kMigrations};
     return kSchema;
 }
 

@@ -25,7 +25,7 @@ struct T_SCHEMA {
 
 /// Tables with a checksum of their own, in the order of writing. "sqlite_schema" (the text of the
 /// schema itself) is summed too; result_blocks is summed without the data, which have their own.
-inline constexpr std::array<const char*, 24> kModelTables{"model",
+inline constexpr std::array<const char*, 25> kModelTables{"model",
                                                           "storeys",
                                                           "modes",
                                                           "spectra",
@@ -48,7 +48,8 @@ inline constexpr std::array<const char*, 24> kModelTables{"model",
                                                           "static_results",
                                                           "stages",
                                                           "ulf_stage_items",
-                                                          "staged_results"};
+                                                          "staged_results",
+                                                          "push_results"};
 
 /// Where a member of a record stands: in a column of another name; as a list in "arrays"; packed
 /// with those of all records; as a part whose members have the columns name_member, with has_name

@@ -23,15 +23,22 @@ struct T_PART {
     const char* nameKey;
     int width;
 };
-constexpr std::array<T_PART, 9> kParts{{{"IDS_QM_DB_PART_LOAD_FACTORS", 8},
-                                        {"IDS_QM_DB_PART_BASE_REACTIONS", 8},
-                                        {"IDS_QM_DB_PART_NODE_IDS", 4},
-                                        {"IDS_QM_DB_PART_DISPLACEMENTS", 8},
-                                        {"IDS_QM_DB_PART_NODE_IDS", 4},
-                                        {"IDS_QM_DB_PART_ELEMENT_IDS", 4},
-                                        {"IDS_QM_DB_PART_DISPLACEMENTS", 8},
-                                        {"IDS_QM_DB_PART_REACTIONS", 8},
-                                        {"IDS_QM_DB_PART_FORCES", 8}}};
+constexpr std::array<T_PART, 16> kParts{{{"IDS_QM_DB_PART_LOAD_FACTORS", 8},
+                                         {"IDS_QM_DB_PART_BASE_REACTIONS", 8},
+                                         {"IDS_QM_DB_PART_NODE_IDS", 4},
+                                         {"IDS_QM_DB_PART_DISPLACEMENTS", 8},
+                                         {"IDS_QM_DB_PART_NODE_IDS", 4},
+                                         {"IDS_QM_DB_PART_ELEMENT_IDS", 4},
+                                         {"IDS_QM_DB_PART_DISPLACEMENTS", 8},
+                                         {"IDS_QM_DB_PART_REACTIONS", 8},
+                                         {"IDS_QM_DB_PART_FORCES", 8},
+                                         {"IDS_QM_DB_PART_NODE_IDS", 4},
+                                         {"IDS_QM_DB_PART_HINGES", 8},
+                                         {"IDS_QM_DB_PART_STEPS", 8},
+                                         {"IDS_QM_DB_PART_EVENTS", 8},
+                                         {"IDS_QM_DB_PART_EVENTS", 4},
+                                         {"IDS_QM_DB_PART_DISPLACEMENTS", 8},
+                                         {"IDS_QM_DB_PART_HINGE_STATES", 8}}};
 
 const T_PART& PartOf(const T_BLOCK_KEY& key)
 {
@@ -187,7 +194,7 @@ int HeadField(const CRecordRow& row, const char* column)
 
 void ThrowBadBlock(const T_BLOCK_KEY& key)
 {
-    const std::string loadCase = std::to_string(key.pushover);
+    const std::string loadCase = std::to_string(key.shown != 0 ? key.shown : key.pushover);
     const std::string chunk = std::to_string(key.chunk + 1);
     const std::string part = MMSGFunction::GetValue(PartOf(key).nameKey);
     if (key.stage != 0) {
@@ -218,7 +225,7 @@ std::span<const std::byte> CheckedBlock(const CSqliteStmt& row, const T_BLOCK_KE
 void WriteResults(const CSqliteDb& db, const T_RESULT_MAP& results)
 {
     for (const auto& [pushover, source] : results) {
-        if (source) CResultWriter(db, pushover, *source).Write();
+        if (source && !source->Run()) CResultWriter(db, pushover, *source).Write();
     }
 }
 

@@ -29,15 +29,26 @@ enum class BLOCK_PART {
     StaticElements,
     StaticDisplacement,
     StaticReaction,
-    StaticForce
+    StaticForce,
+    // Of runs of a push; see runblocks.h.
+    RunNodes,
+    RunHinges,
+    RunSteps,
+    RunEvents,
+    RunTurns,
+    RunDisplacement,
+    RunState
 };
 
 struct T_BLOCK_KEY {
-    int pushover = 0; // key of the load case, of a static one for the parts of static results
+    /// Key of the load case, of a static one for the parts of static results; of a run the row of
+    /// "push_results".
+    int pushover = 0;
     BLOCK_PART part = BLOCK_PART::LoadFactor;
     int chunk = 0; // from 0: nodes 512 * chunk ... of the list of node ids
     int step = 0;  // from 0; of construction stages: the row of "staged_results", from 1
     int stage = 0, stageStep = 0; // of construction stages; for messages only
+    int shown = 0;                // of a run: its load case; for messages only
     bool operator==(const T_BLOCK_KEY&) const = default;
 };
 

@@ -177,9 +177,11 @@ void CheckStaticBlocks(const CSqliteDb& db, const std::vector<T_STATIC_HEAD>& he
         return std::tuple(k.pushover, k.part, k.chunk, k.step);
     };
     std::ranges::sort(expected, {}, place);
-    CSqliteStmt rows(db, std::string("SELECT ") + kBlockColumns + " FROM " + kBlockTable +
-                             " WHERE part >= ?1 ORDER BY pushover, part, chunk, step");
+    CSqliteStmt rows(db,
+                     std::string("SELECT ") + kBlockColumns + " FROM " + kBlockTable +
+                         " WHERE part >= ?1 AND part < ?2 ORDER BY pushover, part, chunk, step");
     rows.Bind(1, std::int64_t{static_cast<int>(BLOCK_PART::StaticNodes)});
+    rows.Bind(2, std::int64_t{static_cast<int>(BLOCK_PART::RunNodes)});
     for (const auto& [key, count] : expected) {
         if (!rows.Step()) ThrowBadBlock(key);
         CheckedBlock(rows, key, count);

@@ -139,9 +139,9 @@ TEST(HingeCase, ATextWithOlderKeysHoldsTheSameModel)
 TEST(HingeCase, FilesOfOlderVersionsOpenAndAreSavedAsTheCurrentVersion)
 {
     const char* const texts[] = {"all_members.json", "hinge_old_keys.json",
-                                 "struct_all_members.json"};
+                                 "struct_all_members.json", "stage_all_members.json"};
     const T_MODEL rich = ParseGood(RichText()).model;
-    for (int version = 1; version <= 3; ++version) {
+    for (int version = 1; version <= 4; ++version) {
         SCOPED_TRACE(version);
         const CTempFolder folder;
         const std::string path = folder.File("model.qmdb");
@@ -162,8 +162,9 @@ TEST(HingeCase, FilesOfOlderVersionsOpenAndAreSavedAsTheCurrentVersion)
         m.styp.plane = MODEL_PLANE::XZ;
         m.loadCases[1] = {"G", {0, 0, -1}, {}, {}, {}, {}, {}};
         m.stages[1] = {"S1", {{1}, {1}, {{1, -1}}}, {}, 2, 3.0};
+        m.pushControl.steps = 7;
         ASSERT_EQ(1, store.Save(path, content, error)) << error.text;
-        EXPECT_EQ(4, BytesOf(path)[63]);
+        EXPECT_EQ(5, BytesOf(path)[63]);
         ASSERT_EQ(1, CModelStore::CheckWhole(path, error)) << error.text;
         ASSERT_EQ(1, CModelStore().Open(path, OPEN_MODE::ReadOnly, again, error)) << error.text;
         EXPECT_TRUE(SameContent(content, again));

@@ -230,7 +230,8 @@ TEST_F(ModelStoreDamage, ASchemaThatRunsExpressionsIsRefusedInEveryVersion)
         "CREATE VIEW modes(key, period, negative_zeros) AS WITH RECURSIVE "
         "n(i) AS (SELECT 1 UNION ALL SELECT i + 1 FROM n) SELECT i, 1.0, 0 FROM n";
     const std::string files[] = {m_path, QM_TEST_DATA "/model-v1.qmdb",
-                                 QM_TEST_DATA "/model-v2.qmdb", QM_TEST_DATA "/model-v3.qmdb"};
+                                 QM_TEST_DATA "/model-v2.qmdb", QM_TEST_DATA "/model-v3.qmdb",
+                                 QM_TEST_DATA "/model-v4.qmdb"};
     for (const std::string& file : files) {
         WriteBytes(m_path, file == m_path ? m_bytes : BytesOf(file));
         ASSERT_EQ(1, Open()) << m_error.text;
