@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_base/dynmodule.h"
-#include "qm_db/analysisworker.h"
+#include "qm_db/analysis/analysisworker.h"
 #include "qm_db/attrctrl.h"
 #include "qm_db/dblib.h"
 #include "qm_db/editdata.h"

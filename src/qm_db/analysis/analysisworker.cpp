@@ -1,4 +1,4 @@
-#include "qm_db/analysisworker.h"
+#include "qm_db/analysis/analysisworker.h"
 
 #include "qm_base/say.h"
 
