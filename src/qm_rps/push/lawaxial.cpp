@@ -1,0 +1,176 @@
+#include "qm_rps/push/lawaxial.h"
+
+#include "qm_base/say.h"
+#include "qm_rps/hinge/hingechoices.h"
+#include "qm_rps/hinge/hingetypefindings.h"
+
+#include <algorithm>
+#include <cmath>
+#include <utility>
+
+namespace {
+
+/// A line of moments over axial forces, tension positive, ascending.
+struct T_LINE_POINT {
+    double axial = 0.0, moment = 0.0;
+};
+using T_LINE = std::vector<T_LINE_POINT>;
+
+constexpr double kAside = 1e-9;  // of the range: how far the ends of an upright piece stand apart
+constexpr double kBeyond = 1e15; // N: no member comes there
+
+/// The points of a curve P / Pmax, M / largest, whichever way they run.
+template <class POINTS>
+T_LINE LineOf(const POINTS& points, double pMax)
+{
+    T_LINE line;
+    for (const T_PM_POINT& p : points)
+        line.push_back({-p.p * pMax, p.m});
+    if (line.front().axial > line.back().axial) std::ranges::reverse(line);
+    const double aside = kAside * (line.back().axial - line.front().axial);
+    T_LINE out;
+    for (T_LINE_POINT p : line) {
+        if (!out.empty() && p.axial <= out.back().axial) {
+            if (p.moment == out.back().moment) continue;
+            p.axial = out.back().axial + aside;
+        }
+        out.push_back(p);
+    }
+    return out;
+}
+
+double At(const T_LINE& line, double axial)
+{
+    const auto above = std::ranges::lower_bound(line, axial, {}, &T_LINE_POINT::axial);
+    if (above == line.end()) return line.back().moment;
+    if (above == line.begin()) return above->moment;
+    const T_LINE_POINT& below = *(above - 1);
+    return below.moment +
+           (above->moment - below.moment) * (axial - below.axial) / (above->axial - below.axial);
+}
+
+/// Both sides at the forces of either, from where both begin to where both end.
+void Join(const T_SIDES<T_LINE>& lines, T_SIDES<double> factor,
+          std::vector<solver::T_AXIAL_STRENGTH>& out)
+{
+    const double low = std::max(lines.pos.front().axial, lines.neg.front().axial);
+    const double high = std::min(lines.pos.back().axial, lines.neg.back().axial);
+    std::vector<double> forces;
+    for (const T_LINE* line : {&lines.pos, &lines.neg})
+        for (const T_LINE_POINT& p : *line)
+            if (low <= p.axial && p.axial <= high) forces.push_back(p.axial);
+    std::ranges::sort(forces);
+    forces.erase(std::ranges::unique(forces).begin(), forces.end());
+    for (const double n : forces)
+        out.push_back({n, factor.pos * At(lines.pos, n), factor.neg * At(lines.neg, n)});
+}
+
+/// Lines of (+) and (-) of a section by the signs of an analysis.
+template <class SIDES>
+T_SIDES<T_LINE> SectionLines(HINGE_COMPONENT component, const SIDES& sides, double pMax)
+{
+    T_SIDES<T_LINE> lines{LineOf(sides.pos, pMax), LineOf(sides.neg, pMax)};
+    if (IsSectionSignOpposite(component)) std::swap(lines.pos, lines.neg);
+    return lines;
+}
+
+/// The strength without an axial force is that of the hinge.
+int FromShape(const T_AXIAL_BASIS& b, const T_SIDES<T_LINE>& lines,
+              std::vector<solver::T_AXIAL_STRENGTH>& out, std::string& reason)
+{
+    T_SIDES<double> factor;
+    for (const bool positive : {true, false}) {
+        const T_LINE& line = positive ? lines.pos : lines.neg;
+        const bool spans = line.size() > 1 && line.front().axial < 0.0 && line.back().axial > 0.0;
+        const double atZero = spans ? At(line, 0.0) : 0.0;
+        if (!(atZero > 0.0) || !std::isfinite(atZero)) {
+            reason = Say("IDS_QM_PUSH_LAW_PM_ZERO", positive ? "(+)" : "(-)");
+            return 0;
+        }
+        (positive ? factor.pos : factor.neg) = (positive ? b.yield.pos : b.yield.neg) / atZero;
+    }
+    Join(lines, factor, out);
+    return 1;
+}
+
+int FromSection(const T_AXIAL_BASIS& b, std::vector<solver::T_AXIAL_STRENGTH>& out,
+                std::string& reason)
+{
+    const auto* strength = b.sources.Strength(b.section, b.material);
+    if (!strength || strength->fault != SECT_FAULT::None) {
+        reason = Say("IDS_QM_PUSH_LAW_NO_PM");
+        return 0;
+    }
+    const double pMax = strength->strength.level.compression;
+    const T_PM_LINES found = b.sources.Lines(b.section, b.material);
+    const auto& sides = b.component == HINGE_COMPONENT::My ? found.y : found.z;
+    if (sides.pos.empty() || sides.neg.empty()) {
+        reason = Say("IDS_QM_PUSH_LAW_NO_PM");
+        return 0;
+    }
+    return FromShape(b, SectionLines(b.component, sides, pMax), out, reason);
+}
+
+int FromSurface(const T_AXIAL_BASIS& b, std::vector<solver::T_AXIAL_STRENGTH>& out,
+                std::string& reason)
+{
+    if (!b.type.yieldSurface) return FromSection(b, out, reason);
+    const T_YIELD_LEVEL& level = b.type.yieldSurface->yield;
+    const T_YIELD_AXIS& axis = b.component == HINGE_COMPONENT::My ? level.y : level.z;
+    if (!axis.used || !(level.compression > 0.0)) {
+        reason = Say("IDS_QM_PUSH_LAW_NO_PM");
+        return 0;
+    }
+    return FromShape(b, SectionLines(b.component, axis.curves, level.compression), out, reason);
+}
+
+int FromUser(const T_AXIAL_BASIS& b, std::vector<solver::T_AXIAL_STRENGTH>& out,
+             std::string& reason)
+{
+    const auto& pmm = b.type.pmm;
+    if (!pmm || !(pmm->Pmax > 0.0)) {
+        reason = Say("IDS_QM_PUSH_LAW_NO_PM");
+        return 0;
+    }
+    const std::size_t axis = b.component == HINGE_COMPONENT::My ? 0 : 1;
+    const T_PMM_CURVES& negative = pmm->negative ? *pmm->negative : pmm->curves;
+    return FromShape(b, {LineOf(pmm->curves[axis], pmm->Pmax), LineOf(negative[axis], pmm->Pmax)},
+                     out, reason);
+}
+
+/// Entered strengths of curves by axial force (compression positive).
+void FromList(const T_SKEL_FEMA& curve, std::vector<solver::T_AXIAL_STRENGTH>& out)
+{
+    for (auto it = curve.curves.rbegin(); it != curve.curves.rend(); ++it) {
+        const double negative = curve.symmetric ? it->sides.pos.yield : it->sides.neg.yield;
+        out.push_back({-it->axial, it->sides.pos.yield, negative});
+    }
+    solver::T_AXIAL_STRENGTH first = out.front(), last = out.back();
+    first.axial = -kBeyond;
+    last.axial = kBeyond;
+    out.insert(out.begin(), first);
+    out.push_back(last);
+}
+
+} // namespace
+
+int StrengthsByAxial(const T_AXIAL_BASIS& basis, std::vector<solver::T_AXIAL_STRENGTH>& out,
+                     std::string& reason)
+{
+    std::vector<solver::T_AXIAL_STRENGTH> rows;
+    int done = 1;
+    const auto* fema = std::get_if<T_SKEL_FEMA>(&basis.curve);
+    const HINGE_INTERACTION interaction = InteractionOf(basis.type, basis.component);
+    if (fema && fema->multiCurve && !fema->curves.empty()) {
+        if (fema->autoYield)
+            done = FromSection(basis, rows, reason);
+        else
+            FromList(*fema, rows);
+    } else if (interaction == HINGE_INTERACTION::PMM) {
+        done = FromSurface(basis, rows, reason);
+    } else if (interaction == HINGE_INTERACTION::User) {
+        done = FromUser(basis, rows, reason);
+    }
+    if (done) out = std::move(rows);
+    return done;
+}

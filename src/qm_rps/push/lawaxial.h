@@ -1,0 +1,35 @@
+// Strength of a bending component by the axial force.
+#pragma once
+
+#include "qm_rps/hinge/hingesources.h"
+#include "qm_solver/pushmodel.h"
+
+#include <string>
+#include <vector>
+
+/// Strengths and yield surfaces of sections call a moment positive that compresses the side +z (My)
+/// or +y (Mz). An analysis prints the first one as negative: its (+) and (-) change places.
+inline bool IsSectionSignOpposite(HINGE_COMPONENT component)
+{
+    return component == HINGE_COMPONENT::My;
+}
+
+/// What the strengths of a component stand on.
+struct T_AXIAL_BASIS {
+    const T_PHGT_D& type;
+    HINGE_COMPONENT component = HINGE_COMPONENT::My; // My or Mz
+    const T_SKEL_CURVE& curve;
+    T_SIDES<double> yield;        // without an axial force, magnitudes, by the signs of an analysis
+    const CHingeSources& sources; // SI
+    int section = 0, material = 0; // of the element
+};
+
+/// Yield strengths by axial force, tension positive, ascending; empty: the axial force does not
+/// count. Curves by axial force: their entered strengths, beyond the list those of its ends. Else
+/// by the interaction of the component: PMM the yield surface of the type, where it has none the
+/// section and material of the element; user the type's P-M curves. These give the shape alone: the
+/// strength at no axial force is the yield strength. Automatic strengths of curves by axial force
+/// follow section and material.
+/// 1 done; 0 with the reason: there is no curve, or it does not reach a force of 0.
+[[nodiscard]] int StrengthsByAxial(const T_AXIAL_BASIS& basis,
+                                   std::vector<solver::T_AXIAL_STRENGTH>& out, std::string& reason);
