@@ -1,0 +1,106 @@
+#include "qm_rps/push/pushcollector.h"
+
+#include "qm_base/say.h"
+#include "qm_rps/push/loadalgebra.h"
+
+CPushCollector::CPushCollector(const T_MODEL& model, const CAnalysisModel& frame,
+                               const T_PUSH_HINGES& hinges, const T_PUSH_CASE& c)
+    : m_frame(frame.Frame()), m_hinges(hinges), m_case(c), m_vertical(VerticalAxis(model)),
+      m_storeys(StoreysOf(model, frame, c.direction)), m_factors(c.stages.size(), 0.0)
+{
+    for (const solver::T_PUSH_STAGE& stage : c.stages)
+        m_forces.push_back(NodeForces(stage.loads, m_frame));
+    m_lawAt.resize(hinges.hinges.size());
+    for (std::size_t i = 0; i < hinges.laws.size(); ++i) {
+        m_lawAt[hinges.laws[i].hinge].push_back(i);
+        m_run.hinges.push_back({hinges.laws[i], {}, {}, {}});
+    }
+    for (const T_PUSH_STOREY& storey : m_storeys)
+        m_run.storeys.push_back({storey.name, {}, {}, {}});
+    m_run.name = c.name;
+    m_run.key = c.key;
+    m_run.direction = c.direction;
+    m_run.nodeIds = frame.NodeIds();
+}
+
+/// Translation or force along the direction of control; of a rotation the turn or moment.
+double CPushCollector::Along(const solver::T_VEC6& v) const
+{
+    if (m_case.direction > 2) return v[m_case.direction];
+    double sum = 0.0;
+    for (std::size_t d = 0; d < 3; ++d)
+        if (m_case.along[d] != 0.0) sum += m_case.along[d] * v[d];
+    return sum;
+}
+
+bool CPushCollector::Take(const solver::T_PUSH_STEP& step)
+{
+    m_factors[step.stage] = step.loadFactor;
+    if (step.stage + 1 != m_case.stages.size()) return false;
+    m_run.loadFactor.push_back(step.loadFactor);
+    m_run.displacement.push_back(Along(step.nodes[m_case.controlNode]));
+    m_run.baseReaction.push_back(0.0 - Along(step.base));
+    m_run.residual.push_back(step.residual);
+    if (step.additional) m_run.additional.push_back(static_cast<int>(m_run.loadFactor.size()));
+    for (std::size_t i = 0; i < m_run.hinges.size(); ++i) {
+        T_PUSH_HINGE_SERIES& series = m_run.hinges[i];
+        const solver::T_HINGE_STATE& state = step.hinges[i];
+        const auto& law = m_hinges.hinges[series.place.hinge].laws[series.place.law];
+        series.deformation.push_back(state.deformation);
+        series.force.push_back(state.force);
+        series.state.push_back(StateOf(series.place, law, state));
+    }
+    TakeStoreys(step);
+    m_run.nodes.push_back(step.nodes);
+    return true;
+}
+
+void CPushCollector::TakeStoreys(const solver::T_PUSH_STEP& step)
+{
+    double below = 0.0;
+    for (std::size_t k = 0; k < m_storeys.size(); ++k) {
+        const T_PUSH_STOREY& storey = m_storeys[k];
+        const double displacement = DisplacementOf(storey, step.nodes, m_case.along);
+        double shear = 0.0;
+        for (std::size_t s = 0; s < m_forces.size(); ++s)
+            shear += m_factors[s] * ShearOf(storey, m_forces[s], m_frame, m_vertical, m_case.along);
+        m_run.storeys[k].displacement.push_back(displacement);
+        m_run.storeys[k].drift.push_back((displacement - below) / storey.height);
+        m_run.storeys[k].shear.push_back(shear);
+        below = displacement;
+    }
+}
+
+void CPushCollector::Take(const solver::T_PUSH_EVENT& event)
+{
+    const int own = static_cast<int>(m_case.stages.size()) - 1;
+    const bool initial = event.stage < 0;
+    if (event.stage != own && !(initial && own == 0)) return;
+    T_PUSH_EVENT_ROW row{initial, event.loadFactor, event.displacement, 0.0 - Along(event.base), {}};
+    for (const solver::T_HINGE_EVENT& h : event.hinges) {
+        const std::size_t at = m_lawAt[h.hinge][h.law];
+        row.hinges.push_back({at, EventTarget(m_run.hinges[at].place, h)});
+    }
+    m_run.events.push_back(std::move(row));
+}
+
+std::string CPushCollector::HingeWords(long hinge) const
+{
+    if (hinge < 0 || static_cast<std::size_t>(hinge) >= m_lawAt.size()) return {};
+    const T_PUSH_LAW_PLACE& place = m_hinges.laws[m_lawAt[static_cast<std::size_t>(hinge)].front()];
+    return Say("IDS_QM_PUSH_HINGE_AT", std::to_string(place.element), place.end);
+}
+
+T_PUSH_RUN CPushCollector::Finish(const solver::T_PUSH_END& end)
+{
+    m_run.cancelled = end.outcome == solver::PUSH_OUTCOME::Cancelled;
+    m_run.status = StatusOf(end.outcome);
+    m_run.outcome = PushOutcomeName(end.outcome);
+    m_run.advice = PushOutcomeAdvice(end.outcome, end.loadFactor, HingeWords(end.hinge));
+    if (end.stage + 1 < m_case.stages.size() &&
+        end.outcome != solver::PUSH_OUTCOME::InitialLoads) {
+        m_run.status = PUSH_STATUS::Failed;
+        m_run.advice = Say("IDS_QM_PUSH_ADVICE_EARLIER") + " " + m_run.advice;
+    }
+    return std::move(m_run);
+}

@@ -1,0 +1,32 @@
+// Collects what the engine tells while a load case is pushed.
+#pragma once
+
+#include "qm_rps/push/pushrun.h"
+
+/// Steps and events of the last stage become the results of the case.
+class CPushCollector {
+public:
+    CPushCollector(const T_MODEL& model, const CAnalysisModel& frame, const T_PUSH_HINGES& hinges,
+                   const T_PUSH_CASE& c);
+
+    /// True: the step is one of the case.
+    bool Take(const solver::T_PUSH_STEP& step);
+    void Take(const solver::T_PUSH_EVENT& event);
+    const T_PUSH_RUN& SoFar() const { return m_run; }
+    T_PUSH_RUN Finish(const solver::T_PUSH_END& end);
+
+private:
+    double Along(const solver::T_VEC6& v) const;
+    void TakeStoreys(const solver::T_PUSH_STEP& step);
+    std::string HingeWords(long hinge) const;
+
+    const solver::T_FRAME& m_frame;
+    const T_PUSH_HINGES& m_hinges;
+    const T_PUSH_CASE& m_case;
+    std::size_t m_vertical = 2;
+    std::vector<T_PUSH_STOREY> m_storeys;
+    std::vector<std::vector<solver::T_VEC3>> m_forces; // by stage and node, at load factor 1
+    std::vector<double> m_factors;                     // of the stages, at present
+    std::vector<std::vector<std::size_t>> m_lawAt;     // by hinge and law: index of the run's
+    T_PUSH_RUN m_run;
+};

@@ -1,0 +1,18 @@
+// How a push has ended, in words.
+#pragma once
+
+#include "qm_solver/pushresult.h"
+
+#include <string>
+
+enum class PUSH_STATUS { Reached, Stopped, Failed };
+inline constexpr const char* kPushStatusNames[] = {"reached", "stopped", "failed"};
+
+/// The target, a stop that was asked for, or anything else.
+PUSH_STATUS StatusOf(solver::PUSH_OUTCOME outcome);
+/// Short name, always in English ("target reached").
+std::string PushOutcomeName(solver::PUSH_OUTCOME outcome);
+/// What it means and what to look at, in the chosen language. loadFactor: of the end; hinge: the
+/// one that ended it, in words, may be empty.
+std::string PushOutcomeAdvice(solver::PUSH_OUTCOME outcome, double loadFactor,
+                              const std::string& hinge);

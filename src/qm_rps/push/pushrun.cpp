@@ -1,0 +1,180 @@
+#include "qm_rps/push/pushrun.h"
+
+#include "qm_base/say.h"
+#include "qm_rps/push/loadalgebra.h"
+#include "qm_rps/push/pushcollector.h"
+#include "qm_solver/framesolver.h"
+
+#include <algorithm>
+#include <cmath>
+
+/// A basis with its factorisation.
+struct CPushRun::T_PREPARED {
+    T_PUSH_BASIS basis;
+    solver::CPushSolver solver;
+    T_PUSH_HINGES hinges;
+    std::vector<solver::T_RESULT> initial; // of the linear analysis, where it was needed
+    std::vector<solver::T_MODE> modes;
+};
+
+CPushRun::CPushRun(CDBDoc& doc) : m_doc(doc), m_model(doc.Data().Model()), m_frame(m_model) {}
+CPushRun::~CPushRun() = default;
+
+std::string CPushRun::Words(const solver::T_SOLVER_ERROR& error) const
+{
+    return m_frame.ErrorOf(error, {}).text;
+}
+
+int CPushRun::BuildFrame(std::string& error)
+{
+    T_ANALYSIS_ERROR fault;
+    m_hasFrame = m_hasFrame || m_frame.BuildFrame(fault);
+    if (!m_hasFrame) error = fault.text;
+    return m_hasFrame ? 1 : 0;
+}
+
+int CPushRun::AxialOf(const solver::T_LOAD_CASE& initial, T_PREPARED& to, std::string& error)
+{
+    solver::CFrameSolver linear;
+    solver::T_SOLVER_ERROR fault;
+    if (linear.Prepare(m_frame.Frame(), fault) && linear.Solve({&initial, 1}, to.initial, fault))
+        return 1;
+    error = Words(fault);
+    return 0;
+}
+
+int CPushRun::PrepareNew(const T_PUSH_BASIS& basis, T_PREPARED& to, std::string& error)
+{
+    to.basis = basis;
+    solver::T_PUSH_MODEL model;
+    if (!BuildInitialLoads(m_frame, basis.initialLoads, model.initial, error)) return 0;
+    const T_POGC_D& control = m_model.pushControl;
+    T_PUSH_LAW_OPTIONS options;
+    options.types = control.hingeTypes;
+    options.flow = control.flow == PUSH_FLOW::Associated ? solver::HINGE_FLOW::Associated
+                                                         : solver::HINGE_FLOW::Rotations;
+    if (NeedsInitialAxial(m_model, control.hingeTypes) && !basis.initialLoads.empty()) {
+        if (!AxialOf(model.initial, to, error)) return 0;
+        options.axial = [&to](std::size_t element, double at) {
+            const auto& force = to.initial.front().force[element];
+            const double place = at * (solver::kBeamPositions - 1);
+            const auto i = std::min(static_cast<std::size_t>(place), solver::kBeamPositions - 2);
+            return force[i][0] + (place - static_cast<double>(i)) * (force[i + 1][0] - force[i][0]);
+        };
+    }
+    if (!BuildPushHinges(m_doc, m_frame.ElementIds(), options, to.hinges, error)) return 0;
+    model.frame = m_frame.Frame();
+    model.hinges = to.hinges.hinges;
+    static_assert(static_cast<int>(PUSH_P_DELTA::Updated) ==
+                  static_cast<int>(solver::P_DELTA::Updated));
+    model.pDelta = static_cast<solver::P_DELTA>(basis.pDelta);
+    model.drifts = DriftsOf(m_model, m_frame, StoreysOf(m_model, m_frame, 0));
+    model.mostEvents = static_cast<std::size_t>(control.mostEvents);
+    solver::T_SOLVER_ERROR fault;
+    if (to.solver.Prepare(std::move(model), fault)) return 1;
+    error = Words(fault);
+    return 0;
+}
+
+int CPushRun::Prepare(const T_PUSH_BASIS& basis, T_PREPARED*& out, std::string& error)
+{
+    for (const auto& prepared : m_prepared)
+        if (prepared->basis == basis) {
+            out = prepared.get();
+            return 1;
+        }
+    auto fresh = std::make_unique<T_PREPARED>();
+    if (!PrepareNew(basis, *fresh, error)) return 0;
+    out = m_prepared.emplace_back(std::move(fresh)).get();
+    return 1;
+}
+
+std::vector<solver::T_VEC6> CPushRun::ModeShape(T_PREPARED& on, int mode, const T_POLC_D& record,
+                                                std::string& error)
+{
+    const std::string number = std::to_string(mode);
+    const auto index = static_cast<std::size_t>(mode - 1);
+    solver::T_SOLVER_ERROR fault;
+    if (mode < 1 || (on.modes.size() <= index && !on.solver.Modes(index + 1, on.modes, fault)) ||
+        on.modes.size() <= index) {
+        error = Say("IDS_QM_PUSH_PATTERN_NO_MODE", number,
+                    fault.reason.empty() ? Say("IDS_QM_PUSH_PATTERN_FEW_MODES") : Words(fault));
+        return {};
+    }
+    std::vector<solver::T_VEC6> shape = on.modes[index].shape;
+    const std::vector<int>& ids = m_frame.NodeIds();
+    const auto at = std::ranges::lower_bound(ids, record.controlNode);
+    const double control = shape[static_cast<std::size_t>(at - ids.begin())]
+                                [static_cast<std::size_t>(record.direction - 1)];
+    double largest = 0.0;
+    for (const solver::T_VEC6& v : shape)
+        for (const double x : v)
+            largest = std::max(largest, std::fabs(x));
+    constexpr double kStill = 1e-9; // of the largest movement
+    if (!(std::fabs(control) > kStill * largest)) {
+        error = Say("IDS_QM_PUSH_PATTERN_MODE_STILL", number);
+        return {};
+    }
+    for (solver::T_VEC6& v : shape)
+        for (double& x : v)
+            x /= control;
+    return shape;
+}
+
+int CPushRun::RunCase(T_PREPARED& on, const T_PUSH_CASE& c, const PUSH_PROGRESS_FN& progress,
+                      T_PUSH_RUN& out, std::string& error)
+{
+    CPushCollector collector(m_model, m_frame, on.hinges, c);
+    solver::T_PUSH_SINK sink;
+    sink.step = [&](const solver::T_PUSH_STEP& step) {
+        if (!collector.Take(step)) return true;
+        const T_PUSH_RUN& so = collector.SoFar();
+        return !progress ||
+               progress({c.name, so.loadFactor.size(), c.stages.back().steps.size(),
+                         so.displacement.back(), so.baseReaction.back()});
+    };
+    sink.event = [&](const solver::T_PUSH_EVENT& event) { collector.Take(event); };
+    solver::T_PUSH_END end;
+    solver::T_SOLVER_ERROR fault;
+    if (!on.solver.Run(c.stages, sink, end, fault)) {
+        error = Words(fault);
+        return 0;
+    }
+    out = collector.Finish(end);
+    return 1;
+}
+
+int CPushRun::Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_RUN>& out,
+                  std::string& error)
+{
+    const auto record = m_model.pushovers.find(key);
+    if (record == m_model.pushovers.end()) {
+        error = Say("IDS_QM_PUSH_NO_INITIAL_CASE");
+        return 0;
+    }
+    const auto fail = [&] {
+        error = Say("IDS_QM_PUSH_CASE_QUOTED", record->second.name) + ": " + error;
+        return 0;
+    };
+    std::vector<int> chain;
+    T_PUSH_BASIS basis;
+    T_PREPARED* on = nullptr;
+    if (!BuildFrame(error)) return 0;
+    if (!PushChainOf(m_model, key, chain, error) || !PushBasisOf(m_model, chain, basis, error) ||
+        !Prepare(basis, on, error))
+        return fail();
+    // Shapes that the engine makes belong to the case at the end of the chain.
+    const MODE_SHAPE_FN shape = [&](int mode, std::string& why) {
+        return ModeShape(*on, mode, record->second, why);
+    };
+    std::vector<T_PUSH_CASE> cases;
+    if (!BuildPushCases(m_model, m_frame, chain, shape, cases, error)) return fail();
+    std::vector<T_PUSH_RUN> runs;
+    for (const T_PUSH_CASE& c : cases) {
+        if (!RunCase(*on, c, progress, runs.emplace_back(), error)) return fail();
+        if (runs.back().cancelled) break;
+    }
+    out.insert(out.end(), std::make_move_iterator(runs.begin()),
+               std::make_move_iterator(runs.end()));
+    return 1;
+}

@@ -1,0 +1,90 @@
+// The push of a model's load cases, and its results.
+#pragma once
+
+#include "qm_rps/push/pushcases.h"
+#include "qm_rps/push/pushend.h"
+#include "qm_rps/push/pushstates.h"
+#include "qm_solver/pushsolver.h"
+
+#include <memory>
+
+/// A component of a hinge over the steps.
+struct T_PUSH_HINGE_SERIES {
+    T_PUSH_LAW_PLACE place;
+    std::vector<double> deformation, force; // beyond the elastic member; as an analysis prints it
+    std::vector<PUSH_STATE> state;
+};
+
+struct T_PUSH_EVENT_ROW {
+    bool initial = false; // while the initial loads came in
+    double loadFactor = 0.0, displacement = 0.0, baseReaction = 0.0;
+    struct T_TURN {
+        std::size_t hinge = 0; // of the run's hinges
+        std::string to;        // see EventTarget
+    };
+    std::vector<T_TURN> hinges;
+};
+
+struct T_PUSH_STOREY_SERIES {
+    std::string name;
+    std::vector<double> displacement, drift, shear;
+};
+
+/// One result of a load case, in SI; index 0 is step 1. Along the direction of control, totals:
+/// what the initial loads have moved is in them.
+struct T_PUSH_RUN {
+    std::string name;
+    int key = 0;               // of the load case
+    std::size_t direction = 0; // 0 to 5
+    PUSH_STATUS status = PUSH_STATUS::Failed;
+    std::string outcome, advice;
+    bool cancelled = false;
+    std::vector<double> loadFactor, displacement, baseReaction, residual;
+    std::vector<int> additional; // numbers of the steps that were asked for
+    std::vector<T_PUSH_EVENT_ROW> events;
+    std::vector<T_PUSH_HINGE_SERIES> hinges;
+    std::vector<T_PUSH_STOREY_SERIES> storeys;
+    std::vector<int> nodeIds;                        // ascending
+    std::vector<std::vector<solver::T_VEC6>> nodes;  // by step, then by node; global
+};
+
+struct T_PUSH_PROGRESS {
+    std::string name;
+    std::size_t done = 0, total = 0; // steps
+    double displacement = 0.0, baseReaction = 0.0;
+};
+/// Told after each step; false: no further one is wanted.
+using PUSH_PROGRESS_FN = std::function<bool(const T_PUSH_PROGRESS&)>;
+
+/// Pushes load cases of one model, which must stay as it is meanwhile. Cases with the same initial
+/// loads and P-Delta share one factorisation.
+class CPushRun {
+public:
+    explicit CPushRun(CDBDoc& doc);
+    ~CPushRun();
+    CPushRun(const CPushRun&) = delete;
+    CPushRun& operator=(const CPushRun&) = delete;
+
+    /// All results of a load case; with a static angle several. 1 done, however they ended; 0
+    /// `error` says what is wrong with model, hinges or load case, `out` unchanged.
+    [[nodiscard]] int Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_RUN>& out,
+                          std::string& error);
+
+private:
+    struct T_PREPARED;
+    int BuildFrame(std::string& error);
+    int Prepare(const T_PUSH_BASIS& basis, T_PREPARED*& out, std::string& error);
+    int PrepareNew(const T_PUSH_BASIS& basis, T_PREPARED& to, std::string& error);
+    int AxialOf(const solver::T_LOAD_CASE& initial, T_PREPARED& to, std::string& error);
+    std::vector<solver::T_VEC6> ModeShape(T_PREPARED& on, int mode, const T_POLC_D& record,
+                                          std::string& error);
+    int RunCase(T_PREPARED& on, const T_PUSH_CASE& c, const PUSH_PROGRESS_FN& progress,
+                T_PUSH_RUN& out, std::string& error);
+    std::string Words(const solver::T_SOLVER_ERROR& error) const;
+
+    CDBDoc& m_doc;
+    const T_MODEL& m_model;
+    CAnalysisModel m_frame;
+    bool m_hasFrame = false;
+    std::vector<std::unique_ptr<T_PREPARED>> m_prepared;
+};
