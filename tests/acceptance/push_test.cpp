@@ -1,0 +1,183 @@
+// The push of frames with plastic hinges against the exact paths of an independent calculation
+// (tests/data/push).
+#include "pushcase.h"
+
+#include <array>
+#include <limits>
+#include <map>
+
+namespace {
+
+using T_POINTS = std::vector<std::array<double, 2>>; // displacement, load factor, over the largest
+
+/// Distance of a point from a chain of lines.
+double Distance(const std::array<double, 2>& p, const T_POINTS& chain)
+{
+    double least = std::numeric_limits<double>::infinity();
+    for (std::size_t i = 0; i + 1 < chain.size(); ++i) {
+        const double dx = chain[i + 1][0] - chain[i][0], dy = chain[i + 1][1] - chain[i][1];
+        const double px = p[0] - chain[i][0], py = p[1] - chain[i][1];
+        const double length2 = dx * dx + dy * dy;
+        const double t = length2 > 0.0 ? std::clamp((px * dx + py * dy) / length2, 0.0, 1.0) : 0.0;
+        least = std::min(least, std::hypot(px - t * dx, py - t * dy));
+    }
+    return least;
+}
+
+/// Pairs of load factor and displacement.
+T_POINTS Chain(const json& pairs, double peak, double furthest)
+{
+    T_POINTS out;
+    for (const json& p : pairs)
+        out.push_back({p[1].get<double>() / furthest, p[0].get<double>() / peak});
+    return out;
+}
+T_POINTS Steps(const json& push, double peak, double furthest)
+{
+    T_POINTS out;
+    for (std::size_t i = 0; i < push.at("load_factor").size(); ++i)
+        out.push_back({push["displacement"][i].get<double>() / furthest,
+                       push["load_factor"][i].get<double>() / peak});
+    return out;
+}
+
+/// Six displacements by node at the end: translations and rotations to a share of their largest.
+void ExpectDisplacements(const json& expected, const json& nodes, double share)
+{
+    double largest[2] = {};
+    for (const json& six : expected)
+        for (std::size_t k = 0; k < 6; ++k)
+            largest[k / 3] = std::max(largest[k / 3], std::fabs(six[k].get<double>()));
+    for (const auto& [id, six] : expected.items())
+        for (std::size_t k = 0; k < 6; ++k)
+            EXPECT_NEAR(six[k].get<double>(), nodes.at(id).back()[k].get<double>(),
+                        share * largest[k / 3])
+                << "node " << id << " direction " << k;
+}
+
+/// Deformation and force at the end, {"3I My": [deformation, force]}.
+void ExpectHinges(const json& expected, const json& hinges, double share)
+{
+    double largest[2] = {};
+    for (const json& pair : expected)
+        for (std::size_t k = 0; k < 2; ++k)
+            largest[k] = std::max(largest[k], std::fabs(pair[k].get<double>()));
+    std::map<std::string, const json*> byName;
+    for (const json& h : hinges) {
+        std::string name = HingeName(h);
+        byName[name.erase(name.find(' '), 1)] = &h;
+    }
+    for (const auto& [name, pair] : expected.items()) {
+        ASSERT_TRUE(byName.contains(name)) << name;
+        const json& h = *byName[name];
+        EXPECT_NEAR(pair[0].get<double>(), h.at("deformation").back().get<double>(),
+                    share * largest[0])
+            << name;
+        EXPECT_NEAR(pair[1].get<double>(), h.at("force").back().get<double>(), share * largest[1])
+            << name;
+    }
+}
+
+/// "1,2,5": what --nodes takes.
+std::string NodeList(const json& byNode)
+{
+    std::string out;
+    for (const auto& [id, unused] : byNode.items())
+        out += (out.empty() ? "" : ",") + id;
+    return out;
+}
+
+// ---- exact paths --------------------------------------------------------------------------------
+
+struct T_PATH {
+    const char* name;
+    const char* pDelta; // "" as in the file
+    int steps;
+    double share;          // of the largest value of its kind
+    double recorded = 0.0; // the finite-element program, of the peak; 0: has no curve
+};
+std::string PrintToString(const T_PATH& row)
+{
+    return std::string(row.name) + " " + row.pDelta;
+}
+
+/// Without P-Delta the path is piecewise linear and both are exact; the tables have ten digits.
+constexpr double kExact = 1e-9;
+/// With it, the share of the axial forces that change, and of the steps at which they are renewed.
+constexpr double kInitial = 1e-4, kUpdated = 1e-6;
+
+// clang-format off
+const T_PATH kPaths[] = {
+    {"pc_propped_point",            "", 20, kExact},
+    {"pc_clamped_udl",              "", 20, kExact},
+    {"pc_portal_combined",          "", 20, kExact},
+    {"pc_two_storey",               "", 20, kExact},
+    {"bb_cantilever_abcde",         "", 20, kExact},
+    {"bb_cantilever_snapback",      "", 20, kExact},
+    {"bb_cantilever_unsym_plus",    "", 20, kExact},
+    {"bb_two_storey_unloading",     "", 20, kExact},
+    {"gr_two_storey_gravity_yield", "", 20, kExact},
+    {"pm_portal_linear",            "", 20, kExact},
+    {"pm_portal_concrete",          "", 20, kExact},
+    {"f3s2b_rigid_mode1",           "", 20, kExact, 4e-4}, // springs of 1e4 EI/L there
+    {"f3s2b_hard_uniform",          "", 20, kExact, 1e-9},
+    {"f3s2b_trilinear_uniform",     "", 20, kExact, 1e-7},
+    {"f3d_hard_x",                  "", 20, kExact, 1e-6},
+    {"pd_cantilever",        "initial", 20, kInitial},
+    {"pd_cantilever",        "updated", 200, kUpdated},
+    {"pd_portal_leaning",    "initial", 20, kInitial},
+    {"pd_two_storey",        "initial", 20, kInitial},
+    {"pd_two_storey",        "updated", 200, kUpdated},
+    {"f3s2b_cap_mode1",      "initial", 20, kInitial, 1e-4},
+    {"f3s2b_cap_mode1",      "updated", 200, kUpdated, 4e-5},
+    {"f3s2b_cap_uniform",    "initial", 20, kInitial, 1e-4},
+    {"f3s2b_cap_uniform",    "updated", 200, kUpdated, 1e-5},
+    {"f9s5b_mode1",          "initial", 20, kInitial, 1e-4},
+    {"f9s5b_mode1",          "updated", 200, kUpdated, 1e-5},
+    {"f3d_cap_x",            "initial", 20, kInitial, 1e-4},
+    {"f3d_cap_x",            "updated", 200, kUpdated, 4e-6},
+    {"f3d_cap_mode",         "initial", 20, kInitial, 1e-4},
+    {"f3d_cap_mode",         "updated", 200, kUpdated, 8e-5},
+};
+// clang-format on
+
+class PushPath : public CPushTest, public testing::WithParamInterface<T_PATH> {};
+
+TEST_P(PushPath, IsThatOfTheIndependentCalculation)
+{
+    const T_PATH& row = GetParam();
+    json file = Data(row.name);
+    const json expected = Data(row.name + std::string(".expected"));
+    if (*row.pDelta) file["pushover_control"]["p_delta"] = row.pDelta;
+    file["pushover"][0]["steps"] = row.steps;
+    const json final = expected.value("final", json::object());
+    const json push = Pushed(file, final.empty() ? "" : " --nodes " + NodeList(final));
+
+    const double peak = expected.at("peak"),
+                 furthest = std::fabs(expected.at("last")[1].get<double>());
+    ExpectVertices(Expected(expected.at("events")), Found(push.at("events")), row.share * peak,
+                   row.share * furthest, 1e-6 * peak);
+    EXPECT_EQ(static_cast<std::size_t>(row.steps), push.at("load_factor").size());
+    EXPECT_NEAR(expected["last"][0], push["load_factor"].back(), row.share * peak);
+    EXPECT_NEAR(expected["last"][1], push["displacement"].back(), row.share * furthest);
+    ExpectDisplacements(final, push.value("nodes", json::object()), row.share);
+    ExpectHinges(expected.value("hinges", json::object()), push.at("hinges"), row.share);
+
+    // Every step lies on the path, and the other program's points lie on ours.
+    const T_POINTS path = Chain(expected.at("path"), peak, furthest);
+    T_POINTS ours = Steps(push, peak, furthest);
+    for (const auto& p : ours)
+        EXPECT_GE(row.share, Distance(p, path)) << p[0] * furthest << ", " << p[1] * peak;
+    for (const T_VERTEX& v : Found(push["events"]))
+        if (v.stage == "push") ours.push_back({v.displacement / furthest, v.loadFactor / peak});
+    ours.push_back(path.front());
+    std::ranges::stable_sort(ours, {}, [](const auto& p) { return p[0]; });
+    for (const auto& p : Chain(expected.value("recorded", json::array()), peak, furthest))
+        EXPECT_GE(row.recorded, Distance(p, ours)) << p[0] * furthest << ", " << p[1] * peak;
+}
+
+INSTANTIATE_TEST_SUITE_P(Frames, PushPath, testing::ValuesIn(kPaths), [](const auto& test) {
+    return std::string(test.param.name) + (*test.param.pDelta ? "_" : "") + test.param.pDelta;
+});
+
+} // namespace
