@@ -41,6 +41,11 @@ T_POINTS Steps(const json& push, double peak, double furthest)
     return out;
 }
 
+double Furthest(const json& expected)
+{
+    return std::fabs(expected.at("last")[1].get<double>());
+}
+
 /// Six displacements by node at the end: translations and rotations to a share of their largest.
 void ExpectDisplacements(const json& expected, const json& nodes, double share)
 {
@@ -89,11 +94,23 @@ std::string NodeList(const json& byNode)
 
 // ---- exact paths --------------------------------------------------------------------------------
 
+/// How closely a path must follow, as shares of the largest value of their kind.
+struct T_CLOSE {
+    double events, steps, peak;
+    bool inOrder = true; // the events; else the same ones in any order
+};
+/// Without P-Delta the path is piecewise linear and both are exact; the tables have ten digits.
+constexpr T_CLOSE kExact{1e-9, 1e-9, 1e-9};
+/// The axial forces of the day, as in the independent calculation.
+constexpr T_CLOSE kUpdated{1e-6, 1e-6, 1e-6};
+/// Those of the initial loads instead: what is left out by the day's changes of axial force. They
+/// move the peak by 3e-5 at most, late points and events by more, and may exchange two events.
+constexpr T_CLOSE kInitial{1.0, 5e-4, 1e-4, false};
+
 struct T_PATH {
     const char* name;
     const char* pDelta; // "" as in the file
-    int steps;
-    double share;          // of the largest value of its kind
+    T_CLOSE close;
     double recorded = 0.0; // the finite-element program, of the peak; 0: has no curve
 };
 std::string PrintToString(const T_PATH& row)
@@ -101,47 +118,58 @@ std::string PrintToString(const T_PATH& row)
     return std::string(row.name) + " " + row.pDelta;
 }
 
-/// Without P-Delta the path is piecewise linear and both are exact; the tables have ten digits.
-constexpr double kExact = 1e-9;
-/// With it, the share of the axial forces that change, and of the steps at which they are renewed.
-constexpr double kInitial = 1e-4, kUpdated = 1e-6;
-
 // clang-format off
 const T_PATH kPaths[] = {
-    {"pc_propped_point",            "", 20, kExact},
-    {"pc_clamped_udl",              "", 20, kExact},
-    {"pc_portal_combined",          "", 20, kExact},
-    {"pc_two_storey",               "", 20, kExact},
-    {"bb_cantilever_abcde",         "", 20, kExact},
-    {"bb_cantilever_snapback",      "", 20, kExact},
-    {"bb_cantilever_unsym_plus",    "", 20, kExact},
-    {"bb_two_storey_unloading",     "", 20, kExact},
-    {"gr_two_storey_gravity_yield", "", 20, kExact},
-    {"pm_portal_linear",            "", 20, kExact},
-    {"pm_portal_concrete",          "", 20, kExact},
-    {"f3s2b_rigid_mode1",           "", 20, kExact, 4e-4}, // springs of 1e4 EI/L there
-    {"f3s2b_hard_uniform",          "", 20, kExact, 1e-9},
-    {"f3s2b_trilinear_uniform",     "", 20, kExact, 1e-7},
-    {"f3d_hard_x",                  "", 20, kExact, 1e-6},
-    {"pd_cantilever",        "initial", 20, kInitial},
-    {"pd_cantilever",        "updated", 200, kUpdated},
-    {"pd_portal_leaning",    "initial", 20, kInitial},
-    {"pd_two_storey",        "initial", 20, kInitial},
-    {"pd_two_storey",        "updated", 200, kUpdated},
-    {"f3s2b_cap_mode1",      "initial", 20, kInitial, 1e-4},
-    {"f3s2b_cap_mode1",      "updated", 200, kUpdated, 4e-5},
-    {"f3s2b_cap_uniform",    "initial", 20, kInitial, 1e-4},
-    {"f3s2b_cap_uniform",    "updated", 200, kUpdated, 1e-5},
-    {"f9s5b_mode1",          "initial", 20, kInitial, 1e-4},
-    {"f9s5b_mode1",          "updated", 200, kUpdated, 1e-5},
-    {"f3d_cap_x",            "initial", 20, kInitial, 1e-4},
-    {"f3d_cap_x",            "updated", 200, kUpdated, 4e-6},
-    {"f3d_cap_mode",         "initial", 20, kInitial, 1e-4},
-    {"f3d_cap_mode",         "updated", 200, kUpdated, 8e-5},
+    {"pc_propped_point",            "", kExact},
+    {"pc_clamped_udl",              "", kExact},
+    {"pc_portal_combined",          "", kExact},
+    {"pc_two_storey",               "", kExact},
+    {"bb_cantilever_abcde",         "", kExact},
+    {"bb_cantilever_snapback",      "", kExact},
+    {"bb_cantilever_unsym_plus",    "", kExact},
+    {"bb_two_storey_unloading",     "", kExact},
+    {"gr_two_storey_gravity_yield", "", kExact},
+    {"pm_portal_linear",            "", kExact},
+    {"pm_portal_concrete",          "", kExact},
+    {"f3s2b_rigid_mode1",           "", kExact, 4e-4}, // springs of 1e4 EI/L there
+    {"f3s2b_hard_uniform",          "", kExact, 1e-9},
+    {"f3s2b_trilinear_uniform",     "", kExact, 1e-7},
+    {"f3d_hard_x",                  "", kExact, 1e-6},
+    {"pd_cantilever",        "initial", kExact}, // its axial force never changes
+    {"pd_cantilever",        "updated", kExact},
+    {"pd_portal_leaning",    "initial", kExact}, // the frame's axial forces make no couple here
+    {"pd_two_storey",        "initial", kUpdated},
+    {"pd_two_storey",        "updated", kUpdated},
+    {"f3s2b_cap_mode1",      "initial", kInitial, 1e-4},
+    {"f3s2b_cap_mode1",      "updated", kUpdated, 4e-5},
+    {"f3s2b_cap_uniform",    "initial", kInitial, 1e-4},
+    {"f3s2b_cap_uniform",    "updated", kUpdated, 1e-5},
+    {"f9s5b_mode1",          "initial", kInitial, 5e-4},
+    {"f9s5b_mode1",          "updated", kUpdated, 1e-5},
+    {"f3d_cap_x",            "initial", kInitial, 1e-4},
+    {"f3d_cap_x",            "updated", kUpdated, 4e-6},
+    {"f3d_cap_mode",         "initial", kInitial, 1e-4},
+    {"f3d_cap_mode",         "updated", kUpdated, 8e-5},
 };
 // clang-format on
 
 class PushPath : public CPushTest, public testing::WithParamInterface<T_PATH> {};
+
+/// Every step lies on the path, and the points of the other program lie on ours.
+void ExpectOnPath(const json& push, const json& expected, const T_PATH& row)
+{
+    const double peak = expected.at("peak"), furthest = Furthest(expected);
+    const T_POINTS path = Chain(expected.at("path"), peak, furthest);
+    T_POINTS ours = Steps(push, peak, furthest);
+    for (const auto& p : ours)
+        EXPECT_GE(row.close.steps, Distance(p, path)) << p[0] * furthest << ", " << p[1] * peak;
+    for (const T_VERTEX& v : Found(push["events"]))
+        if (v.stage == "push") ours.push_back({v.displacement / furthest, v.loadFactor / peak});
+    ours.push_back(path.front());
+    std::ranges::stable_sort(ours, {}, [](const auto& p) { return p[0]; });
+    for (const auto& p : Chain(expected.value("recorded", json::array()), peak, furthest))
+        EXPECT_GE(row.recorded, Distance(p, ours)) << p[0] * furthest << ", " << p[1] * peak;
+}
 
 TEST_P(PushPath, IsThatOfTheIndependentCalculation)
 {
@@ -149,31 +177,24 @@ TEST_P(PushPath, IsThatOfTheIndependentCalculation)
     json file = Data(row.name);
     const json expected = Data(row.name + std::string(".expected"));
     if (*row.pDelta) file["pushover_control"]["p_delta"] = row.pDelta;
-    file["pushover"][0]["steps"] = row.steps;
     const json final = expected.value("final", json::object());
     const json push = Pushed(file, final.empty() ? "" : " --nodes " + NodeList(final));
 
-    const double peak = expected.at("peak"),
-                 furthest = std::fabs(expected.at("last")[1].get<double>());
-    ExpectVertices(Expected(expected.at("events")), Found(push.at("events")), row.share * peak,
-                   row.share * furthest, 1e-6 * peak);
-    EXPECT_EQ(static_cast<std::size_t>(row.steps), push.at("load_factor").size());
-    EXPECT_NEAR(expected["last"][0], push["load_factor"].back(), row.share * peak);
-    EXPECT_NEAR(expected["last"][1], push["displacement"].back(), row.share * furthest);
-    ExpectDisplacements(final, push.value("nodes", json::object()), row.share);
-    ExpectHinges(expected.value("hinges", json::object()), push.at("hinges"), row.share);
-
-    // Every step lies on the path, and the other program's points lie on ours.
-    const T_POINTS path = Chain(expected.at("path"), peak, furthest);
-    T_POINTS ours = Steps(push, peak, furthest);
-    for (const auto& p : ours)
-        EXPECT_GE(row.share, Distance(p, path)) << p[0] * furthest << ", " << p[1] * peak;
-    for (const T_VERTEX& v : Found(push["events"]))
-        if (v.stage == "push") ours.push_back({v.displacement / furthest, v.loadFactor / peak});
-    ours.push_back(path.front());
-    std::ranges::stable_sort(ours, {}, [](const auto& p) { return p[0]; });
-    for (const auto& p : Chain(expected.value("recorded", json::array()), peak, furthest))
-        EXPECT_GE(row.recorded, Distance(p, ours)) << p[0] * furthest << ", " << p[1] * peak;
+    const double peak = expected.at("peak"), furthest = Furthest(expected);
+    T_VERTICES wanted = Expected(expected.at("events")), found = Found(push.at("events"));
+    double highest = 0.0;
+    for (const T_VERTEX& v : found)
+        if (v.stage == "push") highest = std::max(highest, v.loadFactor);
+    EXPECT_NEAR(peak, highest, row.close.peak * peak);
+    EXPECT_EQ(file["pushover"][0]["steps"], push.at("load_factor").size());
+    ExpectOnPath(push, expected, row);
+    const double width = row.close.inOrder ? 1e-6 * peak : std::numeric_limits<double>::infinity();
+    ExpectVertices(wanted, found, row.close.events * peak, row.close.events * furthest, width);
+    EXPECT_NEAR(expected["last"][0], push["load_factor"].back(), row.close.steps * peak);
+    EXPECT_NEAR(expected["last"][1], push["displacement"].back(), 1e-9 * furthest);
+    const double ends = row.close.inOrder ? row.close.events : 2.0 * row.close.steps;
+    ExpectDisplacements(final, push.value("nodes", json::object()), ends);
+    ExpectHinges(expected.value("hinges", json::object()), push.at("hinges"), ends);
 }
 
 INSTANTIATE_TEST_SUITE_P(Frames, PushPath, testing::ValuesIn(kPaths), [](const auto& test) {

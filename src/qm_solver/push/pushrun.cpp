@@ -330,9 +330,8 @@ CPushRun::T_FAULT CPushRun::Update(const T_PUSH_STAGE&, std::optional<double> co
 CPushRun::T_FAULT CPushRun::Approach(const T_PUSH_STAGE& stage, double by)
 {
     const double here = Present(stage);
-    if (auto fault = Update(stage, stage.control == PUSH_CONTROL::LoadFactor
-                                       ? std::nullopt
-                                       : std::optional(here)))
+    if (auto fault = Update(stage, stage.control == PUSH_CONTROL::LoadFactor ? std::nullopt
+                                                                             : std::optional(here)))
         return fault;
     m_path->SetDrive({T_PUSH_DRIVE::KIND::Before, 1.0, {}});
     if (!m_path->Again()) return {};
