@@ -54,6 +54,7 @@ int RunCommand(int argc, char** argv)
     AddHingeCommands(app, code);
     AddCase(app, code);
     AddAnalyse(app, code);
+    AddPush(app, code);
     AddUlf(app, code);
     AddReport(app, code);
     try {

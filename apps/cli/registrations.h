@@ -24,4 +24,5 @@ void AddHingeCommands(CLI::App& app, EXIT_CODE& code);
 void AddCase(CLI::App& app, EXIT_CODE& code);
 void AddAnalyse(CLI::App& app, EXIT_CODE& code);
 void AddUlf(CLI::App& app, EXIT_CODE& code);
+void AddPush(CLI::App& app, EXIT_CODE& code);
 void AddReport(CLI::App& app, EXIT_CODE& code);

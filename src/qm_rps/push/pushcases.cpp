@@ -112,8 +112,8 @@ private:
         if (control.incrementMethod != kByDisplacement) return;
         stage.control = control.masterNodeControl ? solver::PUSH_CONTROL::Displacement
                                                   : solver::PUSH_CONTROL::LargestTranslation;
-        stage.target = fraction * (control.masterNodeControl ? control.masterMaxDispl
-                                                             : control.maxTransDispl);
+        stage.target =
+            fraction * (control.masterNodeControl ? control.masterMaxDispl : control.maxTransDispl);
     }
 
     const T_MODEL& m_model;
@@ -142,9 +142,9 @@ int Turn(const CAnalysisModel& frame, double angle, T_PUSH_CASE& c, std::string&
     c.angle = angle;
     c.name += "@" + FormatText("%g", angle);
     if (frame.Frame().nodes[c.controlNode].fixed[c.direction])
-        return Fail(error, Say("IDS_QM_PUSH_CASE_FIXED",
-                               std::to_string(frame.NodeIds()[c.controlNode]),
-                               kDirectionNames[c.direction]));
+        return Fail(error,
+                    Say("IDS_QM_PUSH_CASE_FIXED", std::to_string(frame.NodeIds()[c.controlNode]),
+                        kDirectionNames[c.direction]));
     if (stage.control != solver::PUSH_CONTROL::Displacement) return 1;
     const double share = c.along[c.direction];
     if (std::fabs(share) != 1.0) return Fail(error, Say("IDS_QM_PUSH_CASE_ANGLE_DISPL"));

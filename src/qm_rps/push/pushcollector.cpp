@@ -76,7 +76,8 @@ void CPushCollector::Take(const solver::T_PUSH_EVENT& event)
     const int own = static_cast<int>(m_case.stages.size()) - 1;
     const bool initial = event.stage < 0;
     if (event.stage != own && !(initial && own == 0)) return;
-    T_PUSH_EVENT_ROW row{initial, event.loadFactor, event.displacement, 0.0 - Along(event.base), {}};
+    T_PUSH_EVENT_ROW row{
+        initial, event.loadFactor, event.displacement, 0.0 - Along(event.base), {}};
     for (const solver::T_HINGE_EVENT& h : event.hinges) {
         const std::size_t at = m_lawAt[h.hinge][h.law];
         row.hinges.push_back({at, EventTarget(m_run.hinges[at].place, h)});
@@ -97,8 +98,7 @@ T_PUSH_RUN CPushCollector::Finish(const solver::T_PUSH_END& end)
     m_run.status = StatusOf(end.outcome);
     m_run.outcome = PushOutcomeName(end.outcome);
     m_run.advice = PushOutcomeAdvice(end.outcome, end.loadFactor, HingeWords(end.hinge));
-    if (end.stage + 1 < m_case.stages.size() &&
-        end.outcome != solver::PUSH_OUTCOME::InitialLoads) {
+    if (end.stage + 1 < m_case.stages.size() && end.outcome != solver::PUSH_OUTCOME::InitialLoads) {
         m_run.status = PUSH_STATUS::Failed;
         m_run.advice = Say("IDS_QM_PUSH_ADVICE_EARLIER") + " " + m_run.advice;
     }

@@ -129,9 +129,8 @@ int CPushRun::RunCase(T_PREPARED& on, const T_PUSH_CASE& c, const PUSH_PROGRESS_
     sink.step = [&](const solver::T_PUSH_STEP& step) {
         if (!collector.Take(step)) return true;
         const T_PUSH_RUN& so = collector.SoFar();
-        return !progress ||
-               progress({c.name, so.loadFactor.size(), c.stages.back().steps.size(),
-                         so.displacement.back(), so.baseReaction.back()});
+        return !progress || progress({c.name, so.loadFactor.size(), c.stages.back().steps.size(),
+                                      so.displacement.back(), so.baseReaction.back()});
     };
     sink.event = [&](const solver::T_PUSH_EVENT& event) { collector.Take(event); };
     solver::T_PUSH_END end;

@@ -44,8 +44,8 @@ struct T_PUSH_RUN {
     std::vector<T_PUSH_EVENT_ROW> events;
     std::vector<T_PUSH_HINGE_SERIES> hinges;
     std::vector<T_PUSH_STOREY_SERIES> storeys;
-    std::vector<int> nodeIds;                        // ascending
-    std::vector<std::vector<solver::T_VEC6>> nodes;  // by step, then by node; global
+    std::vector<int> nodeIds;                       // ascending
+    std::vector<std::vector<solver::T_VEC6>> nodes; // by step, then by node; global
 };
 
 struct T_PUSH_PROGRESS {

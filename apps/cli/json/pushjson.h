@@ -1,0 +1,13 @@
+// Results of the push as JSON.
+#pragma once
+
+#include "qm_rps/push/pushrun.h"
+
+#include <set>
+#include <string>
+#include <vector>
+
+/// A list of the runs in the units given, one entry per stored step, the first one is step 1. Of
+/// the nodes those of `nodes` alone; empty: none.
+std::string PushJson(const std::vector<T_PUSH_RUN>& runs, const std::set<int>& nodes,
+                     const T_UNITS& units);

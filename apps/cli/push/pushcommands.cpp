@@ -1,0 +1,155 @@
+#include "push/pushcommands.h"
+
+#include "console/console.h"
+#include "inputfile.h"
+#include "output.h"
+#include "push/pushtable.h"
+#include "qm_base/say.h"
+#include "qm_base/textformat.h"
+#include "qm_rps/desk/elementlist.h"
+#include "json/pushjson.h"
+
+#ifdef QM_UI
+#include "qm_ui/plot/plotdata.h"
+#endif
+
+#include <algorithm>
+#include <cstdio>
+#include <unistd.h>
+
+namespace {
+
+constexpr std::size_t kRowsOnTerminal = 25;
+
+/// Keys of the load cases that are asked for.
+EXIT_CODE FindCases(CDBDoc& doc, const T_PUSH_OPTIONS& o, std::vector<int>& out)
+{
+    const T_MODEL& model = doc.Data().Model();
+    for (const std::string& name : o.cases) {
+        int key = 0;
+        if (!doc.Attr().FindPolc(name, key))
+            return Complain(EXIT_CODE::Usage, o.file + ": " + Say("IDS_QM_CLI_NO_PUSH", name));
+        if (std::ranges::find(out, key) == out.end()) out.push_back(key);
+    }
+    if (!o.cases.empty() && !o.all) return EXIT_CODE::Done;
+    for (const auto& [key, record] : model.pushovers)
+        if ((o.all || record.control) && std::ranges::find(out, key) == out.end())
+            out.push_back(key);
+    if (!out.empty()) return EXIT_CODE::Done;
+    return Complain(EXIT_CODE::BadInput, o.file + ": " + Say("IDS_QM_CLI_PUSH_NO_CASE"));
+}
+
+EXIT_CODE ReadNodes(CDBDoc& doc, const T_PUSH_OPTIONS& o, std::set<int>& out)
+{
+    if (o.nodes.empty()) return EXIT_CODE::Done;
+    const auto ids = ParseElementList(o.nodes);
+    if (!ids || ids->empty())
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_ELEMENT_LIST", o.nodes));
+    for (const int id : *ids) {
+        if (!doc.Data().Model().nodes.contains(id))
+            return Complain(EXIT_CODE::Usage,
+                            o.file + ": " + Say("IDS_QM_ANALYSIS_NO_NODE", std::to_string(id)));
+        out.insert(id);
+    }
+    return EXIT_CODE::Done;
+}
+
+/// Shows the step, where somebody looks at it; false: Ctrl-C.
+bool ShowStep(const T_PUSH_PROGRESS& p, const T_UNITS& units)
+{
+    if (isatty(STDERR_FILENO))
+        ShowOnTerminal(Say("IDS_QM_CLI_PUSHING", p.name, std::to_string(p.done),
+                           std::to_string(p.total),
+                           FormatText("%.4g", FromSi(p.displacement, units, kDimLength))),
+                       p.done >= p.total);
+    return !CInterrupt::IsAsked();
+}
+
+EXIT_CODE PushAll(CDBDoc& doc, const T_PUSH_OPTIONS& o, const std::vector<int>& keys,
+                  std::vector<T_PUSH_RUN>& out)
+{
+    const CInterrupt interrupt;
+    const T_UNITS units = doc.Unit().Units();
+    CPushRun push(doc);
+    for (const int key : keys) {
+        std::string error;
+        const auto progress = [&](const T_PUSH_PROGRESS& p) { return ShowStep(p, units); };
+        if (!push.Run(key, progress, out, error))
+            return Complain(EXIT_CODE::BadInput, o.file + ": " + error);
+        if (out.back().cancelled) break;
+    }
+    return EXIT_CODE::Done;
+}
+
+EXIT_CODE PrintTables(const T_PUSH_OPTIONS& o, const std::vector<T_PUSH_RUN>& runs,
+                      const T_UNITS& units)
+{
+    for (const std::string& name : o.hinges)
+        if (std::ranges::none_of(runs, [&](const T_PUSH_RUN& r) { return r.name == name; }))
+            return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_NOT_SHOWN", name));
+    const std::size_t rows = isatty(STDOUT_FILENO) ? kRowsOnTerminal : 0;
+    for (const T_PUSH_RUN& run : runs) {
+        std::string text = PushTable(run, units, rows);
+        if (std::ranges::find(o.hinges, run.name) != o.hinges.end())
+            text += PushHingeTable(run, units);
+        std::fwrite(text.data(), 1, text.size(), stdout);
+    }
+    return EXIT_CODE::Done;
+}
+
+#ifdef QM_UI
+/// Base reaction over displacement, one curve for each run.
+T_PLOT CurvePlot(const std::vector<T_PUSH_RUN>& runs, const T_UNITS& units,
+                 const std::string& title)
+{
+    T_PLOT plot;
+    const bool turns = !runs.empty() && runs.front().direction > 2;
+    const std::string force(NameOf(units.force)), length(NameOf(units.length));
+    plot.title = title;
+    plot.x.title = Say("IDS_QM_CLI_PUSH_DISPLACEMENT") + " (" + (turns ? "rad" : length) + ")";
+    plot.y.title =
+        Say("IDS_QM_CLI_PUSH_REACTION") + " (" + (turns ? force + "*" + length : force) + ")";
+    for (const T_PUSH_RUN& run : runs) {
+        T_PLOT_SERIES& s = plot.series.emplace_back();
+        s.name = run.name;
+        for (std::size_t i = 0; i < run.loadFactor.size(); ++i) {
+            s.x.push_back(FromSi(run.displacement[i], units, turns ? kDimNone : kDimLength));
+            s.y.push_back(FromSi(run.baseReaction[i], units, turns ? kDimMoment : kDimForce));
+        }
+    }
+    return plot;
+}
+#endif
+
+} // namespace
+
+EXIT_CODE RunPush(const T_PUSH_OPTIONS& o)
+{
+    if (const EXIT_CODE code = CheckPlotName(o.plot); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = CheckOutputs(
+            o.file, {{o.json, OUTPUT_KIND::Json}, {o.plot, OUTPUT_KIND::Picture}}, o.overwrite);
+        code != EXIT_CODE::Done)
+        return code;
+    CDBDoc doc;
+    std::vector<int> keys;
+    std::set<int> nodes;
+    if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = FindCases(doc, o, keys); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = ReadNodes(doc, o, nodes); code != EXIT_CODE::Done) return code;
+    std::vector<T_PUSH_RUN> runs;
+    const T_UNITS units = doc.Unit().Units();
+    if (const EXIT_CODE code = PushAll(doc, o, keys, runs); code != EXIT_CODE::Done) return code;
+    if (o.json != "-")
+        if (const EXIT_CODE code = PrintTables(o, runs, units); code != EXIT_CODE::Done)
+            return code;
+    EXIT_CODE code = EXIT_CODE::Done;
+    if (!o.json.empty()) code = WriteOutput(o.json, PushJson(runs, nodes, units));
+#ifdef QM_UI
+    if (code == EXIT_CODE::Done && !o.plot.empty())
+        code = WritePicture(CurvePlot(runs, units, doc.Data().Model().styp.title), o.plot);
+#endif
+    if (code != EXIT_CODE::Done) return code;
+    const bool failed = std::ranges::any_of(
+        runs, [](const T_PUSH_RUN& r) { return r.status == PUSH_STATUS::Failed; });
+    return failed ? EXIT_CODE::NotFound : EXIT_CODE::Done;
+}

@@ -1,0 +1,21 @@
+// The command that pushes load cases and shows the results.
+#pragma once
+
+#include "exitcodes.h"
+
+#include <string>
+#include <vector>
+
+struct T_PUSH_OPTIONS {
+    std::string file;
+    std::vector<std::string> cases;  // pushover load cases; empty: all that can be pushed
+    bool all = false;                // every one, those that can't be pushed refused
+    std::string json;                // file, or "-" for standard output
+    std::string plot;                // capacity curves: .svg, .png or .pdf
+    std::vector<std::string> hinges; // results whose hinges are printed
+    std::string nodes;               // "1,5-9": displacements of these in the JSON
+    bool overwrite = false;          // files that are there
+};
+
+/// Done: every push came to its target or to a stop that was asked for; NotFound: one did not.
+EXIT_CODE RunPush(const T_PUSH_OPTIONS& options);

@@ -1,0 +1,19 @@
+// The arguments of the push.
+#include "push/pushcommands.h"
+#include "registershared.h"
+#include "registrations.h"
+
+void AddPush(CLI::App& app, EXIT_CODE& code)
+{
+    auto* sub = app.add_subcommand("push", Say("IDS_QM_HELP_PUSH"));
+    auto o = std::make_shared<T_PUSH_OPTIONS>();
+    AddFile(sub, o->file);
+    sub->add_option("--case", o->cases, Say("IDS_QM_HELP_PUSH_CASE"));
+    sub->add_flag("--all", o->all, Say("IDS_QM_HELP_PUSH_ALL"));
+    AddJson(sub, o->json);
+    sub->add_option("--plot", o->plot, Say("IDS_QM_HELP_PUSH_PLOT"));
+    sub->add_option("--hinges", o->hinges, Say("IDS_QM_HELP_PUSH_HINGES"));
+    sub->add_option("--nodes", o->nodes, Say("IDS_QM_HELP_PUSH_NODES"));
+    AddOverwrite(sub, o->overwrite);
+    sub->callback([o, &code] { code = RunPush(*o); });
+}
