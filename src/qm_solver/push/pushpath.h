@@ -117,6 +117,7 @@ private:
     T_FAULT Sync(std::size_t flow);
     T_FAULT SyncTouched();
     void NoteTurns();
+    void Remember();
 
     CHingeBackbone& Backbone(std::size_t flow)
     {
@@ -151,7 +152,8 @@ private:
     std::vector<double> m_force, m_plastic;
     std::optional<std::size_t> m_control;
     T_PUSH_RATE m_rate;
-    std::vector<double> m_before; // forces' rates of the last way
+    std::vector<double> m_before; // forces' rates of the last way, and that of the control
+    double m_beforeControl = 0.0;
     T_PUSH_DRIVE m_drive;
     struct T_WAS {
         CHingeBackbone::ON on;

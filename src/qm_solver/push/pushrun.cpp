@@ -84,6 +84,7 @@ CPushRun::T_FAULT CPushRun::InitialPath(T_PUSH_END& end, bool& goesOn)
 {
     m_events.clear();
     m_eventCount = 0;
+    m_isFirst = true;
     m_path = std::make_unique<CPushPath>(m_model, m_structure);
     m_nodeWatch.clear();
     m_driftWatch.clear();
@@ -153,6 +154,8 @@ void CPushRun::MakeTargets(const T_PUSH_STAGE& stage)
     const bool byLoad = stage.control == PUSH_CONTROL::LoadFactor;
     m_sign = byLoad || stage.target >= 0.0 ? 1.0 : -1.0;
     m_start = Present(stage);
+    if (m_isFirst) m_origin = m_start;
+    m_isFirst = false;
     if (!byLoad && stage.target < m_start) m_sign = -1.0;
     m_peak = {};
     m_targets.clear();
@@ -405,7 +408,9 @@ CPushRun::T_FAULT CPushRun::Follow(const T_PUSH_STAGE& stage, int number, T_PUSH
             byLoad ? T_PUSH_DRIVE::KIND::Factor : T_PUSH_DRIVE::KIND::Control, m_sign, {}};
     };
     m_path->SetDrive(drive());
-    const double way = std::fabs(stage.target - m_start);
+    // A snap-back may take all of the way here back, not more.
+    const double mostBack =
+        std::max(std::fabs(m_start - m_origin), std::fabs(stage.target - m_start));
     while (m_target < m_targets.size()) {
         T_FAULT fault;
         const CPushPath::WAY found = m_path->Select(fault);
@@ -455,7 +460,7 @@ CPushRun::T_FAULT CPushRun::Follow(const T_PUSH_STAGE& stage, int number, T_PUSH
             m_path->SetDrive({T_PUSH_DRIVE::KIND::Before, 1.0, {}});
             if (byLoad) m_path->SetDrive(drive());
         }
-        if (!byLoad && m_sign * (Present(stage) - m_start) < -1e-6 * way)
+        if (!byLoad && m_sign * (m_start - Present(stage)) > mostBack)
             return finish(PUSH_OUTCOME::SnapBack);
     }
     return finish(PUSH_OUTCOME::Reached);

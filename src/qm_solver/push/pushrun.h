@@ -54,6 +54,8 @@ private:
     std::vector<T_TARGET> m_targets;
     std::size_t m_target = 0;
     double m_start = 0.0, m_sign = 1.0;
+    double m_origin = 0.0; // control displacement before the first stage
+    bool m_isFirst = true;
     T_PEAK m_peak;
     std::vector<T_PUSH_EVENT> m_events; // of the initial loads, until they are final
     std::vector<T_PUSH_STEP> m_steps;   // waiting for their displacements

@@ -254,11 +254,17 @@ double CPushPath::DriveSign() const
             sum += m_rate.flow[k] * flow.stiffness / flow.force;
     }
     if (std::fabs(sum) > least) return sum > 0.0 ? 1.0 : -1.0;
+    if (m_before.empty()) return m_rate.control >= 0.0 ? 1.0 : -1.0;
     sum = 0.0;
+    double size = 0.0;
     for (const CPushFlow& flow : m_flows.flows)
-        for (const std::size_t r : flow.Rows())
-            if (!m_before.empty()) sum += m_rate.force[r] * m_before[r] / (flow.force * flow.force);
-    return sum >= 0.0 ? 1.0 : -1.0;
+        for (const std::size_t r : flow.Rows()) {
+            const double product = m_rate.force[r] * m_before[r] / (flow.force * flow.force);
+            sum += product;
+            size += std::fabs(product);
+        }
+    if (size > 0.0 && std::fabs(sum) > kLeastRate * size) return sum > 0.0 ? 1.0 : -1.0;
+    return m_rate.control * m_beforeControl >= 0.0 ? 1.0 : -1.0; // nothing resisted before
 }
 
 int CPushPath::MakeRates()
@@ -360,6 +366,17 @@ void CPushPath::NoteTurns()
     m_touched.clear();
 }
 
+/// Rates of this way, for what comes after: forces that do not change count as such.
+void CPushPath::Remember()
+{
+    const double least = Least();
+    m_before.assign(m_rate.force.size(), 0.0);
+    for (const CPushFlow& flow : m_flows.flows)
+        for (const std::size_t r : flow.Rows())
+            if (std::fabs(m_rate.force[r]) > least * flow.force) m_before[r] = m_rate.force[r];
+    m_beforeControl = m_rate.control;
+}
+
 CPushPath::WAY CPushPath::Select(T_FAULT& fault)
 {
     if ((fault = SyncTouched())) return WAY::Fault;
@@ -368,7 +385,7 @@ CPushPath::WAY CPushPath::Select(T_FAULT& fault)
         std::vector<T_CHANGE> changes = Violations();
         if (changes.empty()) {
             NoteTurns();
-            m_before = m_rate.force;
+            Remember();
             return WAY::On;
         }
         if (round >= kTogether) { // the largest alone, so that a circle is left

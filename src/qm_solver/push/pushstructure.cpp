@@ -105,8 +105,22 @@ void CPushStructure::MakeRows()
     }
 }
 
+/// A structure that carries nothing yet is measured by what its hinges carry.
+void CPushStructure::MakeForceScale()
+{
+    constexpr double kPart = 1e-3;
+    for (const T_PUSH_HINGE& hinge : m_model.hinges)
+        for (const T_HINGE_LAW& law : hinge.laws)
+            for (const T_HINGE_SIDE* side : {&law.positive, &law.negative})
+                for (const T_BACKBONE_POINT& p : side->points)
+                    m_least =
+                        std::max(m_least, kPart * p.force / (law.component < 3 ? 1.0 : m_extent));
+    m_largest = m_least;
+}
+
 CPushStructure::T_FAULT CPushStructure::Prepare()
 {
+    MakeForceScale();
     T_SOLVER_REASON reason;
     if (!m_assembly.Prepare(m_model.frame, m_dofs, reason)) return Failed(reason);
     if (m_dofs.EquationCount() > 0) {

@@ -57,7 +57,7 @@ public:
     void DropLoads()
     {
         m_loads.clear();
-        m_largest = 0.0;
+        m_largest = m_least;
     }
     T_FAULT SolveLoads();
 
@@ -101,6 +101,7 @@ public:
 
 private:
     void MakeRows();
+    void MakeForceScale();
     T_FAULT Solve(std::span<double> sides, std::size_t count);
     std::vector<double> PlasticOf(std::size_t element, std::span<const double> plastic) const;
     T_VEC12 ElementLoads(std::size_t element, std::span<const double> factors) const;
@@ -121,6 +122,7 @@ private:
     std::vector<double> m_tension; // of the factor; empty: first order
     std::vector<T_PUSH_LOADS> m_loads;
     double m_largest = 0.0; // force of the run so far, what residuals are compared with
+    double m_least = 0.0;   // a part of the strengths, below which it does not fall
     T_PUSH_COST m_cost;
 };
 

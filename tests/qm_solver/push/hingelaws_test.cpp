@@ -1,0 +1,272 @@
+// Hinge laws on structures of one or two members, against forces worked out by hand.
+#include "frames.h"
+#include "qm_solver/pushsolver.h"
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+
+namespace {
+
+using namespace sample;
+
+/// A bar along X with axial stiffness 1000, node 1 free along X; its law in plastic deformations.
+T_PUSH_MODEL Bar(T_HINGE_SIDE positive, T_HINGE_SIDE negative, double spring = 0.0)
+{
+    T_PUSH_MODEL model;
+    model.frame = Empty();
+    AddNode(model.frame, {0, 0, 0});
+    AddNode(model.frame, {2, 0, 0});
+    Fix(model.frame, 0, {0, 1, 2, 3, 4, 5});
+    Fix(model.frame, 1, {1, 2, 3, 4, 5});
+    Join(model.frame, ELEMENT_KIND::Truss, 0, 1);
+    model.frame.materials[0].E = 2000.0;
+    model.frame.sections[0].A = 1.0;
+    T_PUSH_HINGE hinge;
+    hinge.laws.push_back({0, std::move(positive), std::move(negative), spring, {}});
+    model.hinges.push_back(hinge);
+    return model;
+}
+
+T_HINGE_SIDE Side(std::vector<T_BACKBONE_POINT> points, UNLOADING unloading = UNLOADING::Elastic)
+{
+    T_HINGE_SIDE side;
+    side.points = std::move(points);
+    side.unloading = unloading;
+    return side;
+}
+
+T_PUSH_STAGE PushTo(double target, std::size_t node = 1, int direction = 0)
+{
+    T_PUSH_STAGE stage;
+    T_NODAL_LOAD load;
+    load.node = node;
+    load.load[static_cast<std::size_t>(direction)] = 1.0;
+    stage.loads.nodal.push_back(load);
+    stage.node = node;
+    stage.direction = direction;
+    stage.target = target;
+    return stage;
+}
+
+struct T_RUN {
+    std::vector<T_PUSH_STEP> steps;
+    std::vector<T_PUSH_EVENT> events;
+    T_PUSH_END end;
+    T_SOLVER_ERROR error;
+    int done = 0;
+};
+
+T_RUN Pushed(const T_PUSH_MODEL& model, std::vector<T_PUSH_STAGE> stages)
+{
+    T_RUN run;
+    CPushSolver solver;
+    T_PUSH_SINK sink;
+    sink.step = [&](const T_PUSH_STEP& step) {
+        run.steps.push_back(step);
+        return true;
+    };
+    sink.event = [&](const T_PUSH_EVENT& event) { run.events.push_back(event); };
+    run.done = solver.Prepare(model, run.error) && solver.Run(stages, sink, run.end, run.error);
+    return run;
+}
+
+/// Forces of the first hinge at the ends of pushes to these displacements, one after the other.
+std::vector<double> Forces(const T_PUSH_MODEL& model, std::span<const double> places)
+{
+    std::vector<T_PUSH_STAGE> stages;
+    for (const double u : places)
+        stages.push_back(PushTo(u));
+    const T_RUN run = Pushed(model, stages);
+    EXPECT_TRUE(run.done) << run.error.reason.key;
+    EXPECT_EQ(run.end.outcome, PUSH_OUTCOME::Reached)
+        << run.end.displacement << " stage " << run.end.stage;
+    std::vector<double> forces;
+    for (const T_PUSH_STEP& step : run.steps) {
+        forces.push_back(step.hinges[0].force);
+        EXPECT_LE(step.residual, 1e-10);
+    }
+    return forces;
+}
+
+struct T_LAW_CASE {
+    const char* name;
+    T_PUSH_MODEL model;
+    std::vector<double> places, forces;
+};
+
+void ExpectForces(const T_LAW_CASE& c)
+{
+    SCOPED_TRACE(c.name);
+    const std::vector<double> forces = Forces(c.model, c.places);
+    ASSERT_EQ(forces.size(), c.forces.size());
+    for (std::size_t k = 0; k < forces.size(); ++k)
+        EXPECT_NEAR(forces[k], c.forces[k], 1e-9) << "at " << c.places[k];
+}
+
+TEST(PushLaws, FollowsEveryLawForwardsAndBack)
+{
+    const T_HINGE_SIDE ideal = Side({{0, 100}}), weak = Side({{0, 40}});
+    T_HINGE_SIDE gap = ideal, slip = ideal, free;
+    gap.gap = 0.02;
+    slip.slips = true;
+    free.free = true;
+    const std::vector<T_BACKBONE_POINT> curve{{0, 100}, {0.1, 200}, {0.1, 50}, {0.2, 50}};
+    const T_LAW_CASE cases[] = {
+        // 1000 u up to 100, level, back elastically, other side from there: -40, and again 100
+        {"unequal strengths",
+         Bar(ideal, weak),
+         {0.05, 0.3, 0.25, 0.1, 0.24, 0.4},
+         {50, 100, 50, -40, 100, 100}},
+        // hardening 1000: half of what is added after yield
+        {"hardening", Bar(Side({{0, 100}, {1, 1100}}), ideal), {0.3, 0.2, 0.5}, {200, 100, 300}},
+        // spring 1000 in series: 500 u to 100 at 0.2; the law's points hold the spring's part
+        {"spring in series",
+         Bar(Side({{0.1, 100}, {0.3, 200}}), Side({{0.1, 100}}), 1000.0),
+         {0.1, 0.2, 0.5},
+         {50, 100, 200}},
+        // C at u = 0.3 (200 and 0.1), drop to 50 with u back to 0.15, then level
+        {"drop", Bar(Side(curve), ideal), {0.3, 0.301, 0.26}, {200, 50, 9}},
+        // no force from 0.2 down to 0.18, where the gap is as wide as at first
+        {"gap", Bar(gap, ideal), {0.01, 0.03, 0.3, 0.21, 0.19, 0.17}, {0, 10, 100, 10, 0, -10}},
+        // what has flowed is slipped through without force, to the origin and on to the other side
+        {"slip", Bar(slip, ideal), {0.3, 0.2, 0.1, -0.05}, {100, 0, 0, -50}},
+        {"no tension", Bar(free, ideal), {0.2, -0.05, 0.1}, {0, -50, 0}},
+        // the line from (0.3, 100) to the origin, down and up; the other side from the origin
+        {"origin",
+         Bar(Side({{0, 100}}, UNLOADING::Origin), ideal),
+         {0.3, 0.15, 0.24, 0.4, -0.03},
+         {100, 50, 80, 100, -30}},
+        // down the backbone: 100 + 500 (u - 0.1), then 1000 u
+        {"nonlinear elastic",
+         Bar(Side({{0, 100}, {1, 1100}}, UNLOADING::Backbone), ideal),
+         {0.5, 0.3, 0.05, -0.02},
+         {300, 200, 50, -20}},
+    };
+    for (const T_LAW_CASE& c : cases)
+        ExpectForces(c);
+}
+
+/// A column of length 2 along Z, clamped below; E I 100 about both axes. Hinges at the base unless
+/// placed otherwise.
+T_PUSH_MODEL Column()
+{
+    T_PUSH_MODEL model;
+    model.frame = Empty();
+    AddNode(model.frame, {0, 0, 0});
+    AddNode(model.frame, {0, 0, 2});
+    Fix(model.frame, 0, {0, 1, 2, 3, 4, 5});
+    Join(model.frame, ELEMENT_KIND::Beam, 0, 1);
+    model.frame.materials[0].E = 100.0;
+    model.frame.sections[0].Iy = model.frame.sections[0].Iz = 1.0;
+    model.frame.sections[0].A = 1e4;
+    return model;
+}
+
+TEST(PushLaws, BendsAboutBothAxesWithinOnePolygon)
+{
+    // The polygon has its 16 vertices on the circle of radius 100: at 45 degrees it carries 100,
+    // midway between vertices 100 cos(pi / 16).
+    const double pi = std::acos(-1.0);
+    for (const auto& [angle, moment] :
+         {std::pair{pi / 4.0, 100.0}, {0.0, 100.0}, {pi / 16.0, 100.0 * std::cos(pi / 16.0)}}) {
+        T_PUSH_MODEL model = Column();
+        T_PUSH_HINGE hinge;
+        for (const int component : {4, 5})
+            hinge.laws.push_back({component, Side({{0, 100}}), Side({{0, 100}}), 0.0, {}});
+        hinge.biaxial = true;
+        model.hinges.push_back(hinge);
+        T_PUSH_STAGE stage = PushTo(3.0);
+        stage.loads.nodal[0].load = {std::cos(angle), std::sin(angle), 0, 0, 0, 0};
+        const T_RUN run = Pushed(model, {stage});
+        ASSERT_TRUE(run.done) << run.error.reason.key;
+        ASSERT_EQ(run.steps.size(), 1u);
+        EXPECT_NEAR(2.0 * run.steps[0].loadFactor, moment, 1e-8) << angle;
+    }
+}
+
+TEST(PushLaws, StrengthFollowsTheAxialForce)
+{
+    // 100 at no axial force, 0 at 200 of tension or compression. Pushed by (1, 0.5): the moment is
+    // 2 f, the compression of the column -0.5 f (a pull): 2 f = 100 - 0.25 f.
+    T_PUSH_MODEL model = Column();
+    T_PUSH_HINGE hinge;
+    hinge.laws.push_back(
+        {4, Side({{0, 100}}), Side({{0, 100}}), 0.0, {{-200, 0, 0}, {0, 100, 100}, {200, 0, 0}}});
+    for (const HINGE_FLOW flow : {HINGE_FLOW::Rotations, HINGE_FLOW::Associated}) {
+        hinge.flow = flow;
+        model.hinges = {hinge};
+        T_PUSH_STAGE stage = PushTo(3.0);
+        stage.loads.nodal[0].load = {1.0, 0, 0.5, 0, 0, 0};
+        const T_RUN run = Pushed(model, {stage});
+        ASSERT_TRUE(run.done) << run.error.reason.key;
+        EXPECT_NEAR(run.end.loadFactor, 100.0 / 2.25, 1e-8);
+        // Flow in rotations leaves the column its elastic length; normal flow lengthens it by the
+        // slope 100 / 200 of the line times the rotation.
+        const double rotation = std::fabs(run.steps[0].hinges[0].deformation);
+        const double stretch = run.steps[0].nodes[1][2] - 0.5 * run.end.loadFactor * 2.0 / 1e6;
+        EXPECT_NEAR(stretch, flow == HINGE_FLOW::Associated ? 0.5 * rotation : 0.0, 1e-9);
+        // Hardening, 50 a radian times the present strength over 100:
+        model.hinges[0].laws[0].positive = model.hinges[0].laws[0].negative =
+            Side({{0, 100}, {10, 600}});
+        const T_RUN hard = Pushed(model, {stage});
+        const double axial = 0.5 * hard.end.loadFactor;
+        const double turned = std::fabs(hard.steps[0].hinges[0].deformation);
+        EXPECT_NEAR(2.0 * hard.end.loadFactor, (1.0 - axial / 200.0) * (100.0 + 50.0 * turned),
+                    1e-7);
+    }
+}
+
+TEST(PushLaws, SpreadsPlasticityOverTheIntegrationPoints)
+{
+    // Gauss-Lobatto, three points: weights 1/6, 4/6, 1/6. Tip load P, moments 2 P, P, 0; strength
+    // 30, hardening 20 of curvature: at P = 40 curvatures 2.5 and 0.5 beyond.
+    T_PUSH_MODEL model = Column();
+    const double weights[] = {1.0 / 6.0, 4.0 / 6.0, 1.0 / 6.0};
+    for (std::size_t k = 0; k < 3; ++k) {
+        T_PUSH_HINGE hinge;
+        hinge.at = 0.5 * static_cast<double>(k);
+        const double length = 2.0 * weights[k];
+        const T_HINGE_SIDE side = Side({{0, 30}, {100.0 * length, 30 + 20 * 100.0}});
+        hinge.laws.push_back({4, side, side, 0.0, {}});
+        model.hinges.push_back(hinge);
+    }
+    const double turned[] = {2.5 / 3.0, 0.5 * 4.0 / 3.0};
+    const double tip = 40.0 * 8.0 / 300.0 + turned[0] * 2.0 + turned[1] * 1.0;
+    const T_RUN run = Pushed(model, {PushTo(tip)});
+    ASSERT_TRUE(run.done) << run.error.reason.key;
+    EXPECT_NEAR(run.end.loadFactor, 40.0, 1e-9);
+    EXPECT_NEAR(std::fabs(run.steps[0].hinges[0].deformation), turned[0], 1e-10);
+    EXPECT_NEAR(std::fabs(run.steps[0].hinges[1].deformation), turned[1], 1e-10);
+    EXPECT_EQ(run.steps[0].hinges[2].place, 0);
+}
+
+TEST(PushLaws, SpringsAndLinksYield)
+{
+    // A link of 300 that yields at 30 and a spring of 200 to the ground: pushed 0.4 along X.
+    T_PUSH_MODEL model;
+    model.frame = Empty();
+    AddNode(model.frame, {0, 0, 0});
+    AddNode(model.frame, {1, 0, 0});
+    Fix(model.frame, 0, {0, 1, 2, 3, 4, 5});
+    Fix(model.frame, 1, {1, 2, 3, 4, 5});
+    Join(model.frame, ELEMENT_KIND::Link, 0, 1, {300, 0, 0, 0, 0, 0});
+    Join(model.frame, ELEMENT_KIND::Spring, 1, 0, {200, 0, 0, 0, 0, 0});
+    T_HINGE_SIDE free;
+    free.free = true;
+    T_PUSH_HINGE link, spring;
+    link.laws.push_back({0, Side({{0, 30}}), Side({{0, 30}}), 0.0, {}});
+    spring.element = 1;
+    spring.laws.push_back({0, Side({{0, 50}}), free, 0.0, {}});
+    model.hinges = {link, spring};
+    const T_RUN there = Pushed(model, {PushTo(0.4), PushTo(-0.2)});
+    ASSERT_TRUE(there.done) << there.error.reason.key;
+    ASSERT_EQ(there.steps.size(), 2u);
+    EXPECT_NEAR(there.steps[0].loadFactor, 80.0, 1e-9); // both have yielded
+    EXPECT_NEAR(there.steps[0].base[0], -80.0, 1e-9);
+    EXPECT_NEAR(there.steps[1].hinges[0].force, -30.0, 1e-9);
+    EXPECT_NEAR(there.steps[1].hinges[1].force, 0.0, 1e-9); // the spring has opened
+    EXPECT_NEAR(there.steps[1].loadFactor, -110.0, 1e-9);   // of the second stage alone
+}
+
+} // namespace
