@@ -20,10 +20,10 @@ std::string CPushOverCaseGeneratorDlg::BasisText() const
             number(m_basis.height));
     for (std::size_t d = 0; d < m_basis.mode.size(); ++d)
         if (m_basis.mode[d] != 0)
-            text += "\n" + Say(m_basis.ownModes ? "IDS_QM_PUSH_GEN_MODE"
-                                                : "IDS_QM_PUSH_GEN_MODE_COMPUTED",
-                               d == 0 ? "X" : "Y", std::to_string(m_basis.mode[d]),
-                               FormatText("%.1f", m_basis.massPercent[d]));
+            text += "\n" +
+                    Say(m_basis.ownModes ? "IDS_QM_PUSH_GEN_MODE" : "IDS_QM_PUSH_GEN_MODE_COMPUTED",
+                        d == 0 ? "X" : "Y", std::to_string(m_basis.mode[d]),
+                        FormatText("%.1f", m_basis.massPercent[d]));
     return text;
 }
 

@@ -10,8 +10,7 @@ void CPushOverGlobalControlDlg::SetDoc(CDBDoc* doc)
 
 std::vector<T_FINDING> CPushOverGlobalControlDlg::Findings() const
 {
-    return Doc() ? PushControlFindings(m_control, Doc()->Data().Model())
-                 : std::vector<T_FINDING>();
+    return Doc() ? PushControlFindings(m_control, Doc()->Data().Model()) : std::vector<T_FINDING>();
 }
 
 int CPushOverGlobalControlDlg::OnOK()

@@ -162,9 +162,8 @@ private:
         const auto lowest = std::ranges::min_element(
             nodes, {}, [&](const auto& node) { return node.xyz[vertical]; });
         m_basis.height = nodes[m_node].xyz[vertical] - lowest->xyz[vertical];
-        m_basis.target = m_choice.target
-                             ? ToSi(*m_choice.target, m_doc.Unit().Units(), kDimLength)
-                             : kTargetOfHeight * m_basis.height;
+        m_basis.target = m_choice.target ? ToSi(*m_choice.target, m_doc.Unit().Units(), kDimLength)
+                                         : kTargetOfHeight * m_basis.height;
         return m_basis.target > 0.0 ? 1 : Fail(error, Say("IDS_QM_PUSH_GEN_NO_HEIGHT"));
     }
 

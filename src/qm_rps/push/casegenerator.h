@@ -13,10 +13,10 @@ struct T_CASE_CHOICE {
     std::array<bool, 2> directions{true, true}; // X, Y
     bool uniform = true;                        // masses times a unit acceleration
     bool mode = true; // masses times the shape of the mode with the largest mass in the direction
-    double eccentricity = 0.0;     // fraction of the storey's extent; 0: none, and the signs say
+    double eccentricity = 0.0;      // fraction of the storey's extent; 0: none, and the signs say
     bool plus = true, minus = true; // nothing
-    int controlNode = 0;           // 0: see ControlNodeOf
-    std::optional<double> target;  // displacement, length; absent: 2 % of the control node's height
+    int controlNode = 0;            // 0: see ControlNodeOf
+    std::optional<double> target; // displacement, length; absent: 2 % of the control node's height
 };
 
 /// What the cases were made with, in current units.

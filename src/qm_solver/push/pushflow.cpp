@@ -11,6 +11,17 @@ constexpr double kCorner = 1e-9; // width of a corner over that of the line
 
 } // namespace
 
+CAxialLine::CAxialLine(std::vector<T_POINT> points) : m_points(std::move(points))
+{
+    if (!IsGiven()) return;
+    std::size_t low = 0, high = m_points.size() - 1;
+    while (low + 1 < high && m_points[low].strength == m_points[low + 1].strength)
+        ++low;
+    while (high > low + 1 && m_points[high].strength == m_points[high - 1].strength)
+        --high;
+    m_width = m_points[high].axial - m_points[low].axial;
+}
+
 void CAxialLine::Choose(double axial, double rate)
 {
     const double near = kCorner * Width();

@@ -22,7 +22,7 @@ public:
         double axial, strength;
     };
     CAxialLine() = default;
-    explicit CAxialLine(std::vector<T_POINT> points) : m_points(std::move(points)) {}
+    explicit CAxialLine(std::vector<T_POINT> points);
 
     bool IsGiven() const { return m_points.size() > 1; }
     /// Takes the part that holds `axial`; at a corner that into which `rate` leads.
@@ -33,11 +33,13 @@ public:
     double Corner(double rate) const;
     /// The corner of that direction is the end of the line.
     bool IsLast(double rate) const;
-    double Width() const { return m_points.back().axial - m_points.front().axial; }
+    /// What axial forces are compared with: the range in which the strength changes.
+    double Width() const { return m_width; }
 
 private:
     std::vector<T_POINT> m_points;
     std::size_t m_part = 0;
+    double m_width = 1.0;
 };
 
 /// One condition: phi = value - scale * resistance <= 0. Of a side of a law the value is its force,
