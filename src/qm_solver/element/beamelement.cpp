@@ -220,6 +220,20 @@ CBeamElement::T_DEFORMATION CBeamElement::Deformation(const T_VEC12& displacemen
     return d;
 }
 
+T_VEC12 CBeamElement::StrainsOfEnds(const T_VEC12& ends) const
+{
+    const double chordY = -(ends[8] - ends[2]) / m_shape.length;
+    const double chordZ = (ends[7] - ends[1]) / m_shape.length;
+    T_VEC12 strain{};
+    strain[4] = ends[4] - chordY;
+    strain[5] = ends[5] - chordZ;
+    strain[6] = ends[6] - ends[0];
+    strain[9] = ends[9] - ends[3];
+    strain[10] = ends[10] - chordY;
+    strain[11] = ends[11] - chordZ;
+    return strain;
+}
+
 double CBeamElement::StrainEnergy(const T_VEC12& displacement) const
 {
     const T_DEFORMATION d = Deformation(displacement, {});

@@ -45,6 +45,8 @@ public:
     {
         return Deformation(displacement, {}).strain;
     }
+    /// The same of displacements of the ends, local axes.
+    T_VEC12 StrainsOfEnds(const T_VEC12& ends) const;
     /// Displacements of the nodes taken to the ends of the flexible length, local axes, released or
     /// not.
     T_VEC12 EndDisplacements(const T_VEC12& displacement) const;

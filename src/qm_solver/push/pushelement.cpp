@@ -54,6 +54,7 @@ CPushElement::CPushElement(const T_FRAME& frame, std::size_t element,
         m_motion.push_back(Motion(c));
     CondenseSprings();
     MakeInfluence();
+    MakeBasic();
 }
 
 /// Motion of the ends that strains the element as a unit jump at the place does. Told at the end
@@ -169,6 +170,9 @@ T_ELEMENT_LOADS CPushElement::Loads(std::span<const T_SPAN_LOAD> loads, double a
         if (m_components[c].spring > 0.0) Add(out.ends, m_spring[c], force(c));
     for (std::size_t c = 0; c < Size(); ++c)
         out.force[c] = force(c);
+    out.nodes = LoadsAtNodes(out.ends);
+    out.tension = Tension(out.ends);
+    out.acts = std::any_of(out.nodes.begin(), out.nodes.end(), [](double f) { return f != 0.0; });
     return out;
 }
 
@@ -203,22 +207,86 @@ T_VEC12 CPushElement::Across(const T_VEC12& displacement, double tension) const
     return forces;
 }
 
-T_VEC12 CPushElement::AtNodes(const T_VEC12& displacement, std::span<const double> plastic,
-                              const T_VEC12& loads, double tension) const
+/// The six strains of a beam are those of CBeamElement, that of a truss is its elongation, those of
+/// a link or spring its deformations; forces that go with them are the entries of the stiffness.
+void CPushElement::MakeBasic()
 {
-    T_VEC12 forces = Ends(displacement, plastic, loads);
-    if (m_beam) forces = m_beam->AtNodes(forces);
-    if (tension != 0.0) Add(forces, Across(displacement, tension), 1.0);
-    return forces;
+    constexpr std::array<std::size_t, 6> kBeam{4, 5, 6, 9, 10, 11};
+    const ELEMENT_KIND kind = m_element.kind;
+    m_strains = kind == ELEMENT_KIND::Truss ? 1 : 6;
+    m_jump.resize(Size());
+    for (std::size_t k = 0; k < 12; ++k) {
+        T_VEC12 unit{};
+        unit[k] = 1.0;
+        if (m_beam) {
+            const T_VEC12 strains = m_beam->Strains(unit);
+            for (std::size_t i = 0; i < 6; ++i)
+                m_strainOf[i][k] = strains[kBeam[i]];
+        } else if (kind == ELEMENT_KIND::Truss && k % 6 < 3) {
+            m_strainOf[0][k] = (k < 6 ? -1.0 : 1.0) * m_direction[k % 6];
+        } else if (kind != ELEMENT_KIND::Truss) {
+            m_strainOf[k % 6][k] = k < 6 ? -1.0 : 1.0;
+        }
+    }
+    for (std::size_t i = 0; i < m_strains; ++i)
+        for (std::size_t j = 0; j < m_strains; ++j) {
+            if (m_beam)
+                m_basic[i][j] = m_stiffness[kBeam[i]][kBeam[j]];
+            else if (kind == ELEMENT_KIND::Truss)
+                m_basic[i][j] = AxialStiffness();
+            else
+                m_basic[i][j] = m_stiffness[i][j];
+        }
+    // Of beams motions are local already; what they strain has no rigid-body part left.
+    for (std::size_t c = 0; c < Size(); ++c) {
+        if (m_beam) {
+            const T_VEC12 strains = m_beam->StrainsOfEnds(m_motion[c]);
+            for (std::size_t i = 0; i < 6; ++i)
+                m_jump[c][i] = strains[kBeam[i]];
+            continue;
+        }
+        for (std::size_t i = 0; i < m_strains; ++i)
+            m_jump[c][i] = Product(m_strainOf[i], m_motion[c]);
+    }
 }
 
-double CPushElement::Tension(const T_VEC12& displacement, std::span<const double> plastic,
-                             const T_VEC12& loads) const
+double CPushElement::AxialStiffness() const
 {
-    const T_VEC12 ends = Ends(displacement, plastic, loads);
-    if (m_beam) return 0.5 * (ends[6] - ends[0]);
+    T_VEC12 along{};
+    AddPart(along, 6, m_direction);
+    return Product(along, Times(m_stiffness, along));
+}
+
+T_VEC12 CPushElement::LoadsAtNodes(const T_VEC12& loads) const
+{
+    return m_beam ? m_beam->AtNodes(loads) : loads;
+}
+
+T_VEC12 CPushElement::AtNodes(const T_VEC12& displacement, std::span<const double> plastic,
+                              double coupled, double& tension) const
+{
+    T_STRAIN strain{}, force{};
+    for (std::size_t i = 0; i < m_strains; ++i)
+        strain[i] = Product(m_strainOf[i], displacement);
+    for (std::size_t c = 0; c < Size(); ++c)
+        for (std::size_t i = 0; i < m_strains && plastic[c] != 0.0; ++i)
+            strain[i] += plastic[c] * m_jump[c][i];
+    T_VEC12 out{};
+    for (std::size_t i = 0; i < m_strains; ++i) {
+        for (std::size_t j = 0; j < m_strains; ++j)
+            force[i] += m_basic[i][j] * strain[j];
+        Add(out, m_strainOf[i], force[i]);
+    }
+    tension = m_beam ? force[2] : m_element.kind == ELEMENT_KIND::Truss ? force[0] : 0.0;
+    if (coupled != 0.0) Add(out, Across(displacement, coupled), 1.0);
+    return out;
+}
+
+double CPushElement::Tension(const T_VEC12& loads) const
+{
+    if (m_beam) return 0.5 * (loads[6] - loads[0]);
     if (m_element.kind != ELEMENT_KIND::Truss) return 0.0;
-    return 0.5 * Dot(m_direction, Minus(Part(ends, 6), Part(ends, 0)));
+    return 0.5 * Dot(m_direction, Minus(Part(loads, 6), Part(loads, 0)));
 }
 
 T_VEC6 CPushElement::Inside(const T_VEC12& displacement, std::span<const double> plastic,

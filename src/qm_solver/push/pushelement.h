@@ -21,6 +21,9 @@ struct T_PLACED_COMPONENT {
 /// What loads do to an element whose nodes stand still and whose hinges do not flow.
 struct T_ELEMENT_LOADS {
     T_VEC12 ends{};            // forces at its nodes, global axes; of beams: ends, local axes
+    T_VEC12 nodes{};           // forces at its nodes, global axes
+    double tension = 0.0;      // mean axial force
+    bool acts = false;         // some of it is not 0
     std::vector<double> force; // by component
 };
 
@@ -47,23 +50,26 @@ public:
 
     /// axial: the tension that it would have between clamped ends from initial strains.
     T_ELEMENT_LOADS Loads(std::span<const T_SPAN_LOAD> loads, double axial) const;
+    /// What loads do at the nodes, global axes.
+    T_VEC12 LoadsAtNodes(const T_VEC12& loads) const;
     /// Forces of the element on its nodes with the opposite sign (what the nodes need), global
-    /// axes, under displacements of the nodes and plastic deformations of its components; with
-    /// P-Delta.
-    T_VEC12 AtNodes(const T_VEC12& displacement, std::span<const double> plastic,
-                    const T_VEC12& loads, double tension) const;
+    /// axes, under displacements of the nodes and plastic deformations of its components; with the
+    /// couple of `coupled`, without its loads. tension: mean axial force.
+    T_VEC12 AtNodes(const T_VEC12& displacement, std::span<const double> plastic, double coupled,
+                    double& tension) const;
     /// Internal forces at fraction s, by the same.
     T_VEC6 Inside(const T_VEC12& displacement, std::span<const double> plastic,
                   const T_VEC12& loads, std::span<const T_SPAN_LOAD> span, double s) const;
 
-    /// Mean of the axial forces of both ends, tension positive; 0 of links and springs.
-    double Tension(const T_VEC12& displacement, std::span<const double> plastic,
-                   const T_VEC12& loads) const;
+    /// Mean axial force of loads between clamped ends, tension positive; 0 of links and springs.
+    double Tension(const T_VEC12& loads) const;
 
 private:
     T_VEC12 Motion(const T_PLACED_COMPONENT& component) const;
     void CondenseSprings();
     void MakeInfluence();
+    void MakeBasic();
+    double AxialStiffness() const;
     T_VEC12 Ends(const T_VEC12& displacement, std::span<const double> plastic,
                  const T_VEC12& loads) const;
     T_VEC12 Across(const T_VEC12& displacement, double tension) const;
@@ -78,6 +84,12 @@ private:
     std::vector<T_VEC12> m_spring; // by component: gain of its spring, empty without springs
     std::vector<T_VEC12> m_influence;
     std::vector<double> m_own;
+    // Strains (up to 6) by displacements of the nodes, forces by strains, strains by unit jumps.
+    using T_STRAIN = std::array<double, 6>;
+    std::size_t m_strains = 0;
+    std::array<T_VEC12, 6> m_strainOf{};
+    std::array<T_STRAIN, 6> m_basic{};
+    std::vector<T_STRAIN> m_jump;
 };
 
 } // namespace solver

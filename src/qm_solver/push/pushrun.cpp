@@ -66,8 +66,9 @@ CPushRun::T_FAULT CPushRun::Initial(T_PUSH_END& end, bool& goesOn)
          ++tries) {
         const T_PUSH_STATE state = m_path->State();
         T_PUSH_STEP step;
-        if (auto fault = m_structure.Displace({&state, 1}, {&step, 1})) return fault;
-        std::vector<double> now = m_structure.Tensions(state, step.nodes, true);
+        std::vector<double> axial;
+        if (auto fault = m_structure.Displace({&state, 1}, {&step, 1}, axial)) return fault;
+        std::vector<double> now = m_structure.Coupled(std::move(axial));
         if (!Differ(now, tension)) break;
         tension = now;
         if (auto fault = m_structure.Factorise(std::move(now))) return fault;
@@ -318,8 +319,9 @@ CPushRun::T_FAULT CPushRun::Update(const T_PUSH_STAGE&, std::optional<double> co
     for (int tries = 0; tries < kMostUpdates; ++tries) {
         const T_PUSH_STATE state = m_path->State();
         T_PUSH_STEP step;
-        if (auto fault = m_structure.Displace({&state, 1}, {&step, 1})) return fault;
-        std::vector<double> now = m_structure.Tensions(state, step.nodes, true);
+        std::vector<double> axial;
+        if (auto fault = m_structure.Displace({&state, 1}, {&step, 1}, axial)) return fault;
+        std::vector<double> now = m_structure.Coupled(std::move(axial));
         if (!Differ(now, m_structure.Tension())) break;
         if (auto fault = m_structure.Factorise(std::move(now))) return fault;
         if (auto fault = m_structure.SolveLoads()) return fault;
@@ -365,11 +367,12 @@ CPushRun::T_FAULT CPushRun::Store(const T_PUSH_STAGE& stage, int number, bool ad
 CPushRun::T_FAULT CPushRun::Flush(T_PUSH_END& end)
 {
     if (m_steps.empty()) return {};
-    if (auto fault = m_structure.Displace(m_states, m_steps)) return fault;
+    std::vector<double> axial;
+    if (auto fault = m_structure.Displace(m_states, m_steps, axial)) return fault;
     for (std::size_t s = 0; s < m_steps.size() && !m_cancelled; ++s) {
         if (m_steps[s].residual > kBalanced) {
             if (auto fault = m_structure.Refactorise()) return fault;
-            if (auto fault = m_structure.Displace({&m_states[s], 1}, {&m_steps[s], 1}))
+            if (auto fault = m_structure.Displace({&m_states[s], 1}, {&m_steps[s], 1}, axial))
                 return fault;
         }
         if (m_steps[s].residual > kBalanced) {
@@ -377,10 +380,6 @@ CPushRun::T_FAULT CPushRun::Flush(T_PUSH_END& end)
             m_cancelled = true;
             break;
         }
-        const std::vector<double> tension =
-            m_structure.Tensions(m_states[s], m_steps[s].nodes, false);
-        for (const T_PUSH_HINGE& hinge : m_model.hinges)
-            m_steps[s].axial.push_back(tension[hinge.element]);
         m_kept.push_back(
             {m_steps[s].stage, m_steps[s].loadFactor, m_steps[s].displacement, m_states[s]});
         if (m_sink.step && !m_sink.step(m_steps[s])) {

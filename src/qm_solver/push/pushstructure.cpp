@@ -78,6 +78,7 @@ void CPushStructure::MakeRows()
     }
     m_rowsOf.resize(frame.elements.size());
     for (std::size_t e = 0; e < frame.elements.size(); ++e) {
+        m_firstRow.push_back(m_rows.size());
         for (std::size_t c = 0; c < placed[e].size(); ++c) {
             m_rowsOf[e].push_back(m_rows.size());
             m_rows.push_back({e, c});
@@ -192,15 +193,15 @@ CPushStructure::T_FAULT CPushStructure::AddLoads(const T_LOAD_CASE& given, std::
         for (std::size_t c = 0; c < own.force.size() && !settled.empty(); ++c)
             for (std::size_t k = 0; k < 12; ++k)
                 own.force[c] += m_elements[e].Influence(c)[k] * moved[k];
-        const std::vector<double> none(own.force.size());
-        const T_VEC12 held = m_elements[e].AtNodes({}, none, own.ends, 0.0);
         for (std::size_t k = 0; k < ElementSize(element); ++k)
-            if (held[k] != 0.0) {
-                full[ElementIndex(element, k)] -= held[k];
-                addSum(ElementIndex(element, k), -held[k]);
+            if (own.nodes[k] != 0.0) {
+                full[ElementIndex(element, k)] -= own.nodes[k];
+                addSum(ElementIndex(element, k), -own.nodes[k]);
             }
         if (settled.empty()) continue;
-        const T_VEC12 forced = m_elements[e].AtNodes(moved, none, {}, 0.0);
+        double tension = 0.0;
+        const T_VEC12 forced =
+            m_elements[e].AtNodes(moved, std::vector<double>(own.force.size()), 0.0, tension);
         for (std::size_t k = 0; k < ElementSize(element); ++k)
             full[ElementIndex(element, k)] -= forced[k];
     }
@@ -283,13 +284,10 @@ double CPushStructure::Settled(std::size_t set, std::size_t node, std::size_t di
     return settled.empty() ? 0.0 : settled[6 * node + direction];
 }
 
-std::vector<double> CPushStructure::PlasticOf(std::size_t element,
-                                              std::span<const double> plastic) const
+std::span<const double> CPushStructure::PlasticOf(std::size_t element,
+                                                  std::span<const double> plastic) const
 {
-    std::vector<double> own;
-    for (const std::size_t r : m_rowsOf[element])
-        own.push_back(plastic[r]);
-    return own;
+    return plastic.subspan(m_firstRow[element], m_elements[element].Size());
 }
 
 T_VEC12 CPushStructure::ElementLoads(std::size_t element, std::span<const double> factors) const
@@ -303,7 +301,8 @@ T_VEC12 CPushStructure::ElementLoads(std::size_t element, std::span<const double
 
 /// Reactions and, over the unknowns, the loads less the forces of the elements.
 void CPushStructure::Balance(const T_PUSH_STATE& state, std::span<const double> full,
-                             T_PUSH_STEP& step, std::vector<double>& left)
+                             T_PUSH_STEP& step, std::vector<double>& left,
+                             std::vector<double>& tension)
 {
     const T_FRAME& frame = m_model.frame;
     std::vector<double> held(m_dofs.FullCount());
@@ -329,9 +328,15 @@ void CPushStructure::Balance(const T_PUSH_STATE& state, std::span<const double> 
     };
     for (std::size_t e = 0; e < frame.elements.size(); ++e) {
         const T_ELEMENT& element = frame.elements[e];
-        const T_VEC12 forces = m_elements[e].AtNodes(
-            Gather(element, full), PlasticOf(e, state.plastic), ElementLoads(e, state.factors),
-            m_tension.empty() ? 0.0 : m_tension[e]);
+        T_VEC12 forces = m_elements[e].AtNodes(Gather(element, full), PlasticOf(e, state.plastic),
+                                               m_tension.empty() ? 0.0 : m_tension[e], tension[e]);
+        for (std::size_t l = 0; l < state.factors.size(); ++l) {
+            const T_ELEMENT_LOADS& own = m_loads[l].element[e];
+            if (!own.acts) continue;
+            tension[e] += state.factors[l] * own.tension;
+            for (std::size_t k = 0; k < 12; ++k)
+                forces[k] += state.factors[l] * own.nodes[k];
+        }
         for (std::size_t k = 0; k < ElementSize(element); ++k) {
             held[ElementIndex(element, k)] += forces[k];
             measure(k, forces[k]);
@@ -355,8 +360,10 @@ void CPushStructure::Balance(const T_PUSH_STATE& state, std::span<const double> 
 }
 
 CPushStructure::T_FAULT CPushStructure::Displace(std::span<const T_PUSH_STATE> states,
-                                                 std::span<T_PUSH_STEP> steps)
+                                                 std::span<T_PUSH_STEP> steps,
+                                                 std::vector<double>& tension)
 {
+    tension.assign(m_model.frame.elements.size(), 0.0);
     constexpr double kRefine = 1e-11; // residual from which a solution is refined
     const std::size_t n = m_dofs.EquationCount();
     std::vector<double> x(n * states.size(), 0.0);
@@ -380,7 +387,7 @@ CPushStructure::T_FAULT CPushStructure::Displace(std::span<const T_PUSH_STATE> s
                 if (const auto settled = m_loads[l].loads->Settled(); !settled.empty())
                     for (std::size_t i = 0; i < full.size(); ++i)
                         full[i] += states[s].factors[l] * settled[i];
-            Balance(states[s], full, steps[s], left);
+            Balance(states[s], full, steps[s], left, tension);
         };
         take();
         if (steps[s].residual > kRefine && n > 0) {
@@ -389,6 +396,9 @@ CPushStructure::T_FAULT CPushStructure::Displace(std::span<const T_PUSH_STATE> s
                 own[i] += left[i];
             take();
         }
+        steps[s].axial.clear();
+        for (const T_PUSH_HINGE& hinge : m_model.hinges)
+            steps[s].axial.push_back(tension[hinge.element]);
         steps[s].nodes.resize(m_model.frame.nodes.size());
         for (std::size_t i = 0; i < full.size(); ++i)
             steps[s].nodes[i / 6][i % 6] = full[i];
@@ -417,21 +427,10 @@ void CPushStructure::Inside(const T_PUSH_STATE& state, const T_PUSH_STEP& step, 
     }
 }
 
-std::vector<double> CPushStructure::Tensions(const T_PUSH_STATE& state,
-                                             std::span<const T_VEC6> displacement,
-                                             bool coupled) const
+std::vector<double> CPushStructure::Coupled(std::vector<double> tension) const
 {
-    const T_FRAME& frame = m_model.frame;
-    std::vector<double> tension(frame.elements.size(), 0.0);
-    for (std::size_t e = 0; e < tension.size(); ++e) {
-        const ELEMENT_KIND kind = frame.elements[e].kind;
-        if (kind != ELEMENT_KIND::Beam && kind != ELEMENT_KIND::Truss) continue;
-        if (coupled && IsLevel(frame, frame.elements[e], m_model.vertical)) continue;
-        const T_VEC12 u = Gather(frame.elements[e], displacement);
-        const std::vector<double> plastic = PlasticOf(e, state.plastic);
-        const T_VEC12 loads = ElementLoads(e, state.factors);
-        tension[e] = m_elements[e].Tension(u, plastic, loads);
-    }
+    for (std::size_t e = 0; e < tension.size(); ++e)
+        if (IsLevel(m_model.frame, m_model.frame.elements[e], m_model.vertical)) tension[e] = 0.0;
     return tension;
 }
 

@@ -82,15 +82,15 @@ public:
     /// What settlements add to the displacement of a node.
     double Settled(std::size_t set, std::size_t node, std::size_t direction) const;
 
-    /// Displacements of all nodes of states, reactions and the residual, one solve for all. The
-    /// steps come with their forces where `forces` is given.
-    T_FAULT Displace(std::span<const T_PUSH_STATE> states, std::span<T_PUSH_STEP> steps);
+    /// Displacements of all nodes of states, reactions, axial forces at hinges and the residual,
+    /// one solve for all.
+    /// tension: mean axial forces of the elements in the last one.
+    T_FAULT Displace(std::span<const T_PUSH_STATE> states, std::span<T_PUSH_STEP> steps,
+                     std::vector<double>& tension);
     /// Forces inside all elements of a displaced state.
     void Inside(const T_PUSH_STATE& state, const T_PUSH_STEP& step, T_RESULT& out) const;
-    /// Mean axial force of each beam and truss in a displaced state, tension positive; `coupled`:
-    /// of those that P-Delta acts on, 0 of others.
-    std::vector<double> Tensions(const T_PUSH_STATE& state, std::span<const T_VEC6> displacement,
-                                 bool coupled) const;
+    /// Axial forces that P-Delta acts on: 0 of what is level.
+    std::vector<double> Coupled(std::vector<double> tension) const;
 
     const T_FRAME& Frame() const { return m_model.frame; }
     const CFrameDofs& Dofs() const { return m_dofs; }
@@ -103,10 +103,10 @@ private:
     void MakeRows();
     void MakeForceScale();
     T_FAULT Solve(std::span<double> sides, std::size_t count);
-    std::vector<double> PlasticOf(std::size_t element, std::span<const double> plastic) const;
+    std::span<const double> PlasticOf(std::size_t element, std::span<const double> plastic) const;
     T_VEC12 ElementLoads(std::size_t element, std::span<const double> factors) const;
     void Balance(const T_PUSH_STATE& state, std::span<const double> full, T_PUSH_STEP& step,
-                 std::vector<double>& left);
+                 std::vector<double>& left, std::vector<double>& tension);
 
     const T_PUSH_MODEL& m_model;
     CFrameDofs m_dofs;
@@ -116,7 +116,7 @@ private:
     std::vector<CPushElement> m_elements;
     std::vector<T_PUSH_ROW> m_rows;
     std::vector<std::vector<std::size_t>> m_lawRow, m_rowsOf; // by hinge; by element
-    std::vector<std::size_t> m_axialRow;
+    std::vector<std::size_t> m_axialRow, m_firstRow;          // by hinge; by element
     std::vector<std::size_t> m_termFrom; // influence of the rows over the unknowns
     std::vector<T_TERM> m_terms;
     std::vector<double> m_tension; // of the factor; empty: first order
