@@ -12,7 +12,8 @@ namespace {
 constexpr double kLost = 1e-7;      // relative size of a pivot that has lost its digits
 constexpr double kSingular = 1e-14; // reciprocal condition, rows and columns scaled
 constexpr double kResidual = 1e-9;  // of a solution that is not refined any more
-constexpr std::size_t kMostChanges = 100;
+constexpr std::size_t kMostChanges = 200;
+constexpr std::size_t kCheckEvery = 8; // changes
 
 using T_DENSE = Eigen::Map<Eigen::MatrixXd, 0, Eigen::OuterStride<>>;
 using T_LINE = Eigen::Map<const Eigen::VectorXd>;
@@ -154,6 +155,17 @@ int CFlowSystem::Invert()
     m_known = true;
     m_changes = 0;
     return 1;
+}
+
+int CFlowSystem::Direction(std::vector<double>& x)
+{
+    if (!m_known || m_changes % kCheckEvery == 0) {
+        std::vector<double> right(m_size, 0.0);
+        right[0] = 1.0;
+        return Solve(right, x);
+    }
+    x.assign(m_inverse.begin(), m_inverse.begin() + static_cast<long>(m_size));
+    return std::all_of(x.begin(), x.end(), [](double v) { return std::isfinite(v); });
 }
 
 int CFlowSystem::Solve(std::span<const double> right, std::vector<double>& x)

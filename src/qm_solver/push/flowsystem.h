@@ -27,6 +27,9 @@ public:
     /// Values in place of those of equation k.
     void SetEquation(std::size_t k, std::span<const double> row);
 
+    /// Solution for the right side 1, 0, 0 ...: the direction of the path. As Solve, but compared
+    /// with the matrix only now and then.
+    [[nodiscard]] int Direction(std::vector<double>& x);
     /// Solves for a right side, refined with the matrix. 1 done; 0 the matrix is singular to
     /// rounding.
     [[nodiscard]] int Solve(std::span<const double> right, std::vector<double>& x);

@@ -9,7 +9,9 @@ namespace {
 
 constexpr double kNear = 1e-10;    // of strength, or of elastic deformation: at an event
 constexpr double kSettled = 1e-13; // of strengths: yield conditions are met
+constexpr double kKept = 1e-11;    // ... by the sums of many ways
 constexpr int kMostCorrections = 12;
+constexpr std::size_t kMostSince = 50;
 
 using ON = CHingeBackbone::ON;
 
@@ -22,6 +24,37 @@ CPushPath::CPushPath(const T_PUSH_MODEL& model, CPushStructure& structure)
 {
     m_isCurved = std::any_of(m_flows.flows.begin(), m_flows.flows.end(),
                              [](const CPushFlow& flow) { return flow.HangsOnAxial(); });
+    m_lock.resize(m_flows.flows.size());
+    for (std::size_t f = 0; f < m_lock.size(); ++f)
+        UpdateLock(f);
+    MakeRowScales();
+    for (const T_PUSH_HINGE& hinge : model.hinges) {
+        m_firstLaw.push_back(m_lawCount);
+        m_lawCount += hinge.laws.size();
+    }
+}
+
+void CPushPath::MakeRowScales()
+{
+    m_byForce.assign(m_structure.RowCount(), 0.0);
+    m_byStiffness = m_byForce;
+    for (const CPushFlow& flow : m_flows.flows)
+        for (const std::size_t r : flow.Rows()) {
+            m_byForce[r] = std::max(m_byForce[r], 1.0 / flow.force);
+            m_byStiffness[r] = std::max(m_byStiffness[r], flow.stiffness / flow.force);
+        }
+}
+
+void CPushPath::UpdateLock(std::size_t f)
+{
+    const CPushFlow& flow = m_flows.flows[f];
+    const CHingeBackbone& backbone = Backbone(f);
+    T_LOCK& lock = m_lock[f];
+    lock.isPlain = backbone.On() == ON::Locked && flow.Rows().size() == 1 && !flow.HangsOnAxial();
+    if (!lock.isPlain) return;
+    lock = {flow.Rows()[0],   flow.positive ? 1.0 : -1.0,
+            backbone.Upper(), backbone.Lower(),
+            flow.force,       true};
 }
 
 bool CPushPath::LoadGrows(double part) const
@@ -100,15 +133,11 @@ void CPushPath::SumUp()
         for (T_WATCH& w : m_watches)
             w.value += m_factors[l] * w.byLoads[l];
     }
-    for (std::size_t c = 0; c < m_plastic.size(); ++c) {
-        const double q = m_plastic[c];
-        if (q == 0.0) continue;
-        const double* column = m_columnOf[c]->force.data();
-        for (std::size_t r = 0; r < m_force.size(); ++r)
-            m_force[r] += q * column[r];
-        for (std::size_t w = 0; w < m_watches.size(); ++w)
-            m_watches[w].value += q * m_columnOf[c]->watch[w];
-    }
+    AddColumns(m_plastic, m_force);
+    for (std::size_t c = 0; c < m_plastic.size(); ++c)
+        for (std::size_t w = 0; w < m_watches.size() && m_plastic[c] != 0.0; ++w)
+            m_watches[w].value += m_plastic[c] * m_columnOf[c]->watch[w];
+    m_sinceSum = 0;
 }
 
 void CPushPath::ChoosePart(std::size_t f)
@@ -127,6 +156,14 @@ double CPushPath::NextEvent(double back) const
         first = std::min(first, std::max(-back, distance / rate));
     };
     for (std::size_t f = 0; f < m_flows.flows.size(); ++f) {
+        if (const T_LOCK& lock = m_lock[f]; lock.isPlain) {
+            const double force = lock.sign * m_force[lock.row];
+            const double rate = lock.sign * m_rate.force[lock.row];
+            if (rate > least * lock.force) take(lock.upper - force, rate);
+            if (rate < -least * lock.force && lock.lower > -CHingeBackbone::kFar)
+                take(force - lock.lower, -rate);
+            continue;
+        }
         const CPushFlow& flow = m_flows.flows[f];
         const CHingeBackbone& backbone = Backbone(f);
         const bool flows = IsActive(f);
@@ -150,6 +187,7 @@ double CPushPath::NextEvent(double back) const
 
 void CPushPath::Advance(double by)
 {
+    ++m_sinceSum;
     m_factors.back() += by * m_rate.factor;
     for (std::size_t r = 0; r < m_force.size(); ++r)
         m_force[r] += by * m_rate.force[r];
@@ -168,6 +206,10 @@ long CPushPath::Turn()
     long outside = -1;
     for (std::size_t f = 0; f < m_flows.flows.size(); ++f) {
         const CPushFlow& flow = m_flows.flows[f];
+        if (const T_LOCK& lock = m_lock[f]; lock.isPlain) {
+            const double force = lock.sign * m_force[lock.row], close = kNear * lock.force;
+            if (force < lock.upper - close && force > lock.lower + close) continue;
+        }
         CHingeBackbone& backbone = Backbone(f);
         const double near = kNear * flow.force, close = near / flow.stiffness;
         const bool flows = IsActive(f);
@@ -213,9 +255,12 @@ long CPushPath::Turn()
 /// A drop goes down to its end, whatever else begins on the way.
 void CPushPath::TakeDrive(std::span<const std::size_t> begun)
 {
+    m_dropping.insert(m_dropping.end(), begun.begin(), begun.end());
+    std::erase_if(m_dropping, [&](std::size_t f) { return Backbone(f).On() != ON::Drop; });
+    std::sort(m_dropping.begin(), m_dropping.end());
+    m_dropping.erase(std::unique(m_dropping.begin(), m_dropping.end()), m_dropping.end());
     T_PUSH_DRIVE drive;
-    for (std::size_t f = 0; f < m_flows.flows.size(); ++f)
-        if (Backbone(f).On() == ON::Drop) drive.flows.push_back(f);
+    drive.flows = m_dropping;
     if (!drive.flows.empty()) {
         drive.kind = T_PUSH_DRIVE::KIND::Forces;
         drive.sign = -1.0;
@@ -247,7 +292,8 @@ CPushPath::T_FAULT CPushPath::Correct(std::optional<double> control)
 {
     std::vector<double> right, x;
     for (int tries = 0; tries < kMostCorrections; ++tries) {
-        SumUp();
+        const bool isSum = tries > 0 || m_sinceSum > kMostSince;
+        if (isSum) SumUp();
         right.assign(m_system.Size(), 0.0);
         double worst = 0.0;
         if (control && m_control && m_border == 0) {
@@ -259,8 +305,9 @@ CPushPath::T_FAULT CPushPath::Correct(std::optional<double> control)
             right[k + 1] = Phi(f, Resistance(f));
             worst = std::max(worst, std::fabs(right[k + 1]) / m_flows.flows[f].force);
         }
-        if (worst <= kSettled) return {};
-        if (tries > 0)
+        if (worst <= (isSum ? kSettled : kKept)) return {};
+        if (!isSum) continue;
+        if (tries > 1)
             if (auto fault = Rebuild()) return fault; // slopes may hang on the forces
         if (!m_system.Solve(right, x)) return {};
         m_factors.back() += x[0];
@@ -287,22 +334,21 @@ double CPushPath::Deformation(std::size_t hinge, std::size_t law, double& rate) 
 
 std::vector<T_HINGE_STATE> CPushPath::HingeStates() const
 {
-    std::vector<std::vector<std::array<int, 2>>> vertex(m_model.hinges.size());
-    for (std::size_t h = 0; h < vertex.size(); ++h)
-        vertex[h].resize(m_model.hinges[h].laws.size());
+    std::vector<std::array<int, 2>> vertex(m_lawCount);
     for (std::size_t f = 0; f < m_flows.flows.size(); ++f) {
         const CPushFlow& flow = m_flows.flows[f];
-        int& most = vertex[flow.hinge][flow.law][flow.positive ? 0 : 1];
+        int& most = vertex[m_firstLaw[flow.hinge] + flow.law][flow.positive ? 0 : 1];
         most = std::max(most, Backbone(f).Vertex());
     }
     std::vector<T_HINGE_STATE> out;
+    out.reserve(m_lawCount);
     double rate = 0.0;
-    for (std::size_t h = 0; h < vertex.size(); ++h)
-        for (std::size_t l = 0; l < vertex[h].size(); ++l) {
+    for (std::size_t h = 0; h < m_model.hinges.size(); ++h)
+        for (std::size_t l = 0; l < m_model.hinges[h].laws.size(); ++l) {
+            const auto [positive, negative] = vertex[out.size()];
             T_HINGE_STATE& state = out.emplace_back();
             state.deformation = Deformation(h, l, rate);
             state.force = m_force[m_structure.RowOf(h, l)];
-            const auto [positive, negative] = vertex[h][l];
             const bool isPositive = negative == 0 || (positive > 0 && state.force >= 0.0);
             state.place = isPositive ? positive : -negative;
         }

@@ -131,7 +131,10 @@ private:
     T_FAULT Rebuild();
     void SumUp();
     void TakeDrive(std::span<const std::size_t> begun);
-    double Least() const { return kLeastRate * Norm(); }
+    double Least() const { return kLeastRate * m_norm; }
+    void MakeRowScales();
+    void UpdateLock(std::size_t flow);
+    void AddColumns(std::span<const double> by, std::span<double> forces) const;
 
     double Resistance(std::size_t flow) const;
     double Phi(std::size_t flow, double resistance) const;
@@ -151,7 +154,20 @@ private:
     std::vector<double> m_factors; // by set of loads
     std::vector<double> m_force, m_plastic;
     std::optional<std::size_t> m_control;
+    /// What decides about a flow that is locked and hangs on the force of one row alone.
+    struct T_LOCK {
+        std::size_t row = 0;
+        double sign = 1.0, upper = 0.0, lower = 0.0, force = 1.0;
+        bool isPlain = false;
+    };
+    std::vector<std::size_t> m_firstLaw; // by hinge: its first law of all
+    std::size_t m_lawCount = 0;
+    std::vector<T_LOCK> m_lock;                   // by flow
+    std::vector<double> m_byForce, m_byStiffness; // by row: rates over strengths
+    std::vector<std::size_t> m_dropping;          // flows whose force falls at one deformation
     T_PUSH_RATE m_rate;
+    double m_norm = 0.0;          // of the rates
+    std::size_t m_sinceSum = 0;   // ways since the forces were summed up
     std::vector<double> m_before; // forces' rates of the last way, and that of the control
     double m_beforeControl = 0.0;
     T_PUSH_DRIVE m_drive;

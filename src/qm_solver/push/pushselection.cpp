@@ -144,6 +144,7 @@ void CPushPath::Deactivate(std::size_t f)
 /// The flow's place in the system as its backbone is now.
 CPushPath::T_FAULT CPushPath::Sync(std::size_t f)
 {
+    UpdateLock(f);
     if (IsActive(f)) Deactivate(f);
     if (!IsMoving(m_flows.backbones[m_flows.flows[f].backbone].On())) return {};
     return Activate(f);
@@ -151,9 +152,7 @@ CPushPath::T_FAULT CPushPath::Sync(std::size_t f)
 
 int CPushPath::SolveDirection(std::vector<double>& x)
 {
-    std::vector<double> right(m_system.Size(), 0.0);
-    right[0] = 1.0;
-    if (m_system.Solve(right, x)) return 1;
+    if (m_system.Direction(x)) return 1;
     // The control does not move along the path, or the load factor alone does not: another border.
     for (const int border : {0, 1, 2}) {
         if (border == m_border || (border == 0 && !m_control)) continue;
@@ -170,7 +169,7 @@ int CPushPath::SolveDirection(std::vector<double>& x)
                     row[k + 1] += d.factor * m_columnOf[d.row]->watch[*m_control];
         }
         m_system.SetControl(row);
-        if (m_system.Solve(right, x)) return 1;
+        if (m_system.Direction(x)) return 1;
     }
     return 0;
 }
@@ -193,15 +192,11 @@ void CPushPath::RatesOf(std::span<const double> x, double sign)
         m_rate.force[r] = m_rate.factor * loads[r];
     for (T_WATCH& w : m_watches)
         w.rate = m_rate.factor * w.byLoads[set];
-    for (std::size_t c = 0; c < rows; ++c) {
-        const double q = m_rate.plastic[c];
-        if (q == 0.0) continue;
-        const double* column = m_columnOf[c]->force.data();
-        for (std::size_t r = 0; r < rows; ++r)
-            m_rate.force[r] += q * column[r];
-        for (std::size_t w = 0; w < m_watches.size(); ++w)
-            m_watches[w].rate += q * m_columnOf[c]->watch[w];
-    }
+    AddColumns(m_rate.plastic, m_rate.force);
+    for (std::size_t c = 0; c < rows; ++c)
+        for (std::size_t w = 0; w < m_watches.size() && m_rate.plastic[c] != 0.0; ++w)
+            m_watches[w].rate += m_rate.plastic[c] * m_columnOf[c]->watch[w];
+    m_norm = Norm();
     m_rate.control = m_control ? m_watches[*m_control].rate : m_rate.factor;
 }
 
@@ -209,11 +204,33 @@ void CPushPath::RatesOf(std::span<const double> x, double sign)
 double CPushPath::Norm() const
 {
     double norm = 0.0;
-    for (const CPushFlow& flow : m_flows.flows)
-        for (const std::size_t r : flow.Rows())
-            norm = std::max({norm, std::fabs(m_rate.force[r]) / flow.force,
-                             std::fabs(m_rate.plastic[r]) * flow.stiffness / flow.force});
+    for (std::size_t r = 0; r < m_byForce.size(); ++r)
+        norm = std::max({norm, std::fabs(m_rate.force[r]) * m_byForce[r],
+                         std::fabs(m_rate.plastic[r]) * m_byStiffness[r]});
     return norm;
+}
+
+/// Sums of columns, four at a time: the forces are read and written once for all four.
+void CPushPath::AddColumns(std::span<const double> by, std::span<double> forces) const
+{
+    std::array<const double*, 4> column{};
+    std::array<double, 4> factor{};
+    std::size_t count = 0;
+    const auto flush = [&] {
+        for (std::size_t k = count; k < 4; ++k)
+            column[k] = column[0], factor[k] = 0.0;
+        for (std::size_t r = 0; r < forces.size(); ++r)
+            forces[r] += factor[0] * column[0][r] + factor[1] * column[1][r] +
+                         factor[2] * column[2][r] + factor[3] * column[3][r];
+        count = 0;
+    };
+    for (std::size_t c = 0; c < by.size(); ++c) {
+        if (by[c] == 0.0) continue;
+        column[count] = m_columnOf[c]->force.data();
+        factor[count] = by[c];
+        if (++count == 4) flush();
+    }
+    if (count > 0) flush();
 }
 
 /// Which way along the line of solutions: rates are those of sign +1.
@@ -283,6 +300,10 @@ std::vector<CPushPath::T_CHANGE> CPushPath::Violations()
     std::vector<T_CHANGE> out;
     const double least = Least();
     for (std::size_t f = 0; f < m_flows.flows.size(); ++f) {
+        if (const T_LOCK& lock = m_lock[f]; lock.isPlain) {
+            const double force = lock.sign * m_force[lock.row], near = kAtLimit * lock.force;
+            if (force < lock.upper - near && force > lock.lower + near) continue;
+        }
         CPushFlow& flow = m_flows.flows[f];
         const CHingeBackbone& backbone = m_flows.backbones[flow.backbone];
         if (flow.HangsOnAxial()) {
