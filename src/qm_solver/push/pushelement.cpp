@@ -263,7 +263,7 @@ T_VEC12 CPushElement::LoadsAtNodes(const T_VEC12& loads) const
 }
 
 T_VEC12 CPushElement::AtNodes(const T_VEC12& displacement, std::span<const double> plastic,
-                              double coupled, double& tension) const
+                              double coupled, double& tension, std::span<double> own) const
 {
     T_STRAIN strain{}, force{};
     for (std::size_t i = 0; i < m_strains; ++i)
@@ -276,6 +276,11 @@ T_VEC12 CPushElement::AtNodes(const T_VEC12& displacement, std::span<const doubl
         for (std::size_t j = 0; j < m_strains; ++j)
             force[i] += m_basic[i][j] * strain[j];
         Add(out, m_strainOf[i], force[i]);
+    }
+    for (std::size_t c = 0; c < own.size(); ++c) {
+        own[c] = 0.0;
+        for (std::size_t i = 0; i < m_strains; ++i)
+            own[c] -= m_jump[c][i] * force[i];
     }
     tension = m_beam ? force[2] : m_element.kind == ELEMENT_KIND::Truss ? force[0] : 0.0;
     if (coupled != 0.0) Add(out, Across(displacement, coupled), 1.0);

@@ -25,6 +25,7 @@ struct T_ELEMENT_LOADS {
     double tension = 0.0;      // mean axial force
     bool acts = false;         // some of it is not 0
     std::vector<double> force; // by component
+    std::vector<double> moved; // by component: what settlements of its nodes add; may be empty
 };
 
 /// Elastic stiffness with the springs of the hinges in series, over the displacements of the nodes;
@@ -54,9 +55,10 @@ public:
     T_VEC12 LoadsAtNodes(const T_VEC12& loads) const;
     /// Forces of the element on its nodes with the opposite sign (what the nodes need), global
     /// axes, under displacements of the nodes and plastic deformations of its components; with the
-    /// couple of `coupled`, without its loads. tension: mean axial force.
+    /// couple of `coupled`, without its loads. tension: mean axial force; own: forces of the
+    /// components, Size() of them or none.
     T_VEC12 AtNodes(const T_VEC12& displacement, std::span<const double> plastic, double coupled,
-                    double& tension) const;
+                    double& tension, std::span<double> own = {}) const;
     /// Internal forces at fraction s, by the same.
     T_VEC6 Inside(const T_VEC12& displacement, std::span<const double> plastic,
                   const T_VEC12& loads, std::span<const T_SPAN_LOAD> span, double s) const;

@@ -190,9 +190,10 @@ CPushStructure::T_FAULT CPushStructure::AddLoads(const T_LOAD_CASE& given, std::
         T_ELEMENT_LOADS& own = set.element.back();
         T_VEC12 moved{};
         if (!settled.empty()) moved = Gather(element, settled);
-        for (std::size_t c = 0; c < own.force.size() && !settled.empty(); ++c)
+        own.moved.resize(settled.empty() ? 0 : own.force.size());
+        for (std::size_t c = 0; c < own.moved.size(); ++c)
             for (std::size_t k = 0; k < 12; ++k)
-                own.force[c] += m_elements[e].Influence(c)[k] * moved[k];
+                own.moved[c] += m_elements[e].Influence(c)[k] * moved[k];
         for (std::size_t k = 0; k < ElementSize(element); ++k)
             if (own.nodes[k] != 0.0) {
                 full[ElementIndex(element, k)] -= own.nodes[k];
@@ -223,7 +224,9 @@ CPushStructure::T_FAULT CPushStructure::SolveLoads()
                             sides.begin() + static_cast<long>((l + 1) * n));
         set.force.resize(RowCount());
         for (std::size_t r = 0; r < RowCount(); ++r) {
-            double sum = set.element[m_rows[r].element].force[m_rows[r].component];
+            const T_ELEMENT_LOADS& own = set.element[m_rows[r].element];
+            const std::size_t c = m_rows[r].component;
+            double sum = own.force[c] + (own.moved.empty() ? 0.0 : own.moved[c]);
             for (std::size_t k = m_termFrom[r]; k < m_termFrom[r + 1]; ++k)
                 sum += m_terms[k].factor * set.unknowns[static_cast<std::size_t>(m_terms[k].index)];
             set.force[r] = sum;
@@ -305,7 +308,7 @@ void CPushStructure::Balance(const T_PUSH_STATE& state, std::span<const double> 
                              std::vector<double>& tension)
 {
     const T_FRAME& frame = m_model.frame;
-    std::vector<double> held(m_dofs.FullCount());
+    std::vector<double> held(m_dofs.FullCount()), rows(RowCount());
     double largest = 0.0;
     const auto measure = [&](std::size_t index, double force) {
         largest = std::max(largest, std::fabs(force) / (index % 6 < 3 ? 1.0 : m_extent));
@@ -328,12 +331,16 @@ void CPushStructure::Balance(const T_PUSH_STATE& state, std::span<const double> 
     };
     for (std::size_t e = 0; e < frame.elements.size(); ++e) {
         const T_ELEMENT& element = frame.elements[e];
-        T_VEC12 forces = m_elements[e].AtNodes(Gather(element, full), PlasticOf(e, state.plastic),
-                                               m_tension.empty() ? 0.0 : m_tension[e], tension[e]);
+        T_VEC12 forces =
+            m_elements[e].AtNodes(Gather(element, full), PlasticOf(e, state.plastic),
+                                  m_tension.empty() ? 0.0 : m_tension[e], tension[e],
+                                  std::span(rows).subspan(m_firstRow[e], m_elements[e].Size()));
         for (std::size_t l = 0; l < state.factors.size(); ++l) {
             const T_ELEMENT_LOADS& own = m_loads[l].element[e];
             if (!own.acts) continue;
             tension[e] += state.factors[l] * own.tension;
+            for (std::size_t c = 0; c < own.force.size(); ++c)
+                rows[m_firstRow[e] + c] += state.factors[l] * own.force[c];
             for (std::size_t k = 0; k < 12; ++k)
                 forces[k] += state.factors[l] * own.nodes[k];
         }
@@ -355,6 +362,14 @@ void CPushStructure::Balance(const T_PUSH_STATE& state, std::span<const double> 
         const bool turns = m_dofs.Owner(i) % 6 > 2;
         worst = std::max(worst, std::fabs(left[i]) / (turns ? m_extent : 1.0));
     }
+    // The forces that the path has told its hinges are those of the displaced elements.
+    std::size_t law = 0;
+    for (std::size_t h = 0; h < m_model.hinges.size() && !step.hinges.empty(); ++h)
+        for (std::size_t l = 0; l < m_model.hinges[h].laws.size(); ++l, ++law) {
+            const double apart = rows[m_lawRow[h][l]] - step.hinges[law].force;
+            const bool turns = m_model.hinges[h].laws[l].component > 2;
+            worst = std::max(worst, std::fabs(apart) / (turns ? m_extent : 1.0));
+        }
     m_largest = std::max(m_largest, largest);
     step.residual = m_largest > 0.0 ? worst / m_largest : worst;
 }
