@@ -120,10 +120,10 @@ private:
     void WriteNodes(const T_PUSH_RUN& run, const std::set<int>& nodes)
     {
         m_w.Key("nodes").Object(kRows);
-        for (std::size_t i = 0; i < run.nodeIds.size(); ++i) {
-            if (!nodes.contains(run.nodeIds[i])) continue;
-            m_w.Key(std::to_string(run.nodeIds[i])).List(kJsonOneLine);
-            for (const auto& step : run.nodes) {
+        for (std::size_t i = 0; i < run.data.nodes.size(); ++i) {
+            if (!nodes.contains(run.data.nodes[i])) continue;
+            m_w.Key(std::to_string(run.data.nodes[i])).List(kJsonOneLine);
+            for (const auto& step : run.data.displacement) {
                 m_w.List(kJsonOneLine);
                 for (std::size_t d = 0; d < 6; ++d)
                     m_w.Value(FromSi(step[i][d], m_units, d < 3 ? kDimLength : kDimNone));

@@ -129,8 +129,10 @@ solver::T_VEC3 AxisOf(std::size_t direction)
 }
 
 /// The case in one direction of its static angle.
-int Turn(const CAnalysisModel& frame, double angle, T_PUSH_CASE& c, std::string& error)
+int Turn(const CAnalysisModel& frame, double step, int times, T_PUSH_CASE& c, std::string& error)
 {
+    const double angle = times * step;
+    c.turn = times;
     if (c.direction > 1) return Fail(error, Say("IDS_QM_PUSH_CASE_ANGLE"));
     solver::T_LOAD_CASE axis;
     axis.selfWeight = c.along;
@@ -228,7 +230,7 @@ int BuildPushCases(const T_MODEL& model, const CAnalysisModel& frame, const std:
         constexpr double kLeast = 1.0; // degrees: 359 directions
         if (!(angle >= kLeast)) return Fail(error, Say("IDS_QM_PUSH_CASE_ANGLE_SMALL"));
         for (int i = 1; i * angle < 360.0; ++i)
-            if (!Turn(frame, i * angle, cases.emplace_back(c), error)) return 0;
+            if (!Turn(frame, angle, i, cases.emplace_back(c), error)) return 0;
     }
     out = std::move(cases);
     return 1;

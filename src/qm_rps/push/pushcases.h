@@ -11,6 +11,7 @@ struct T_PUSH_CASE {
     std::string name; // of a direction "NAME@90"
     int key = 0;
     std::optional<double> angle; // degrees
+    int turn = 0;                // so many times the static angle
     std::size_t direction = 0;   // 0 to 5: X to RZ; of a turned case the axis nearest to `along`
     solver::T_VEC3 along{};      // unit vector of displacement and base reaction; 0: a rotation
     std::size_t controlNode = 0; // of the engine

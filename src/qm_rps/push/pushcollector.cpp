@@ -3,10 +3,34 @@
 #include "qm_base/say.h"
 #include "qm_rps/push/loadalgebra.h"
 
+namespace {
+
+/// What the recorder reads of the engine's model.
+solver::T_PUSH_MODEL EngineOf(const T_PUSH_HINGES& hinges)
+{
+    solver::T_PUSH_MODEL model;
+    model.hinges = hinges.hinges;
+    return model;
+}
+
+} // namespace
+
+T_RUN_HEAD CPushCollector::HeadOf(const T_PUSH_CASE& c)
+{
+    T_RUN_HEAD head;
+    head.turn = c.turn;
+    head.angle = c.angle.value_or(0.0);
+    if (c.direction > 2) head.control[c.direction] = 1.0;
+    for (std::size_t d = 0; d < 3; ++d)
+        if (c.direction < 3) head.control[d] = c.along[d];
+    return head;
+}
+
 CPushCollector::CPushCollector(const T_MODEL& model, const CAnalysisModel& frame,
                                const T_PUSH_HINGES& hinges, const T_PUSH_CASE& c)
     : m_frame(frame.Frame()), m_hinges(hinges), m_case(c), m_vertical(VerticalAxis(model)),
-      m_storeys(StoreysOf(model, frame, c.direction)), m_factors(c.stages.size(), 0.0)
+      m_storeys(StoreysOf(model, frame, c.direction)), m_factors(c.stages.size(), 0.0),
+      m_recorder(model, c.key, HeadOf(c), EngineOf(hinges), frame.NodeIds(), frame.ElementIds())
 {
     for (const solver::T_PUSH_STAGE& stage : c.stages)
         m_forces.push_back(NodeForces(stage.loads, m_frame));
@@ -20,7 +44,7 @@ CPushCollector::CPushCollector(const T_MODEL& model, const CAnalysisModel& frame
     m_run.name = c.name;
     m_run.key = c.key;
     m_run.direction = c.direction;
-    m_run.nodeIds = frame.NodeIds();
+    m_run.turn = c.turn;
 }
 
 /// Translation or force along the direction of control; of a rotation the turn or moment.
@@ -51,7 +75,7 @@ bool CPushCollector::Take(const solver::T_PUSH_STEP& step)
         series.state.push_back(StateOf(series.place, law, state));
     }
     TakeStoreys(step);
-    m_run.nodes.push_back(step.nodes);
+    m_recorder.Add(step);
     return true;
 }
 
@@ -76,6 +100,7 @@ void CPushCollector::Take(const solver::T_PUSH_EVENT& event)
     const int own = static_cast<int>(m_case.stages.size()) - 1;
     const bool initial = event.stage < 0;
     if (event.stage != own && !(initial && own == 0)) return;
+    m_recorder.Add(event);
     T_PUSH_EVENT_ROW row{
         initial, event.loadFactor, event.displacement, 0.0 - Along(event.base), {}};
     for (const solver::T_HINGE_EVENT& h : event.hinges) {
@@ -102,5 +127,7 @@ T_PUSH_RUN CPushCollector::Finish(const solver::T_PUSH_END& end)
         m_run.status = PUSH_STATUS::Failed;
         m_run.advice = Say("IDS_QM_PUSH_ADVICE_EARLIER") + " " + m_run.advice;
     }
+    m_recorder.End(end);
+    m_run.data = m_recorder.Take();
     return std::move(m_run);
 }

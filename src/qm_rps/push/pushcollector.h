@@ -16,6 +16,7 @@ public:
     T_PUSH_RUN Finish(const solver::T_PUSH_END& end);
 
 private:
+    static T_RUN_HEAD HeadOf(const T_PUSH_CASE& c);
     double Along(const solver::T_VEC6& v) const;
     void TakeStoreys(const solver::T_PUSH_STEP& step);
     std::string HingeWords(long hinge) const;
@@ -28,5 +29,6 @@ private:
     std::vector<std::vector<solver::T_VEC3>> m_forces; // by stage and node, at load factor 1
     std::vector<double> m_factors;                     // of the stages, at present
     std::vector<std::vector<std::size_t>> m_lawAt;     // by hinge and law: index of the run's
+    CPushRecorder m_recorder;
     T_PUSH_RUN m_run;
 };

@@ -143,8 +143,14 @@ int CPushRun::RunCase(T_PREPARED& on, const T_PUSH_CASE& c, const PUSH_PROGRESS_
     return 1;
 }
 
+void CPushRun::Keep(std::vector<T_PUSH_RUN>& runs)
+{
+    for (T_PUSH_RUN& run : runs)
+        m_doc.Data().SetPushResult(run.key, MakePushRun(run.data), run.turn);
+}
+
 int CPushRun::Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_RUN>& out,
-                  std::string& error)
+                  std::string& error, const std::vector<double>& extra)
 {
     const auto record = m_model.pushovers.find(key);
     if (record == m_model.pushovers.end()) {
@@ -169,7 +175,9 @@ int CPushRun::Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_
     std::vector<T_PUSH_CASE> cases;
     if (!BuildPushCases(m_model, m_frame, chain, shape, cases, error)) return fail();
     std::vector<T_PUSH_RUN> runs;
-    for (const T_PUSH_CASE& c : cases) {
+    for (T_PUSH_CASE& c : cases) {
+        std::vector<double>& additional = c.stages.back().additional;
+        additional.insert(additional.end(), extra.begin(), extra.end());
         if (!RunCase(*on, c, progress, runs.emplace_back(), error)) return fail();
         if (runs.back().cancelled) break;
     }

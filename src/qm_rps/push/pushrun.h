@@ -35,6 +35,7 @@ struct T_PUSH_STOREY_SERIES {
 struct T_PUSH_RUN {
     std::string name;
     int key = 0;               // of the load case
+    int turn = 0;              // of its static angle: so many times
     std::size_t direction = 0; // 0 to 5
     PUSH_STATUS status = PUSH_STATUS::Failed;
     std::string outcome, advice;
@@ -44,8 +45,7 @@ struct T_PUSH_RUN {
     std::vector<T_PUSH_EVENT_ROW> events;
     std::vector<T_PUSH_HINGE_SERIES> hinges;
     std::vector<T_PUSH_STOREY_SERIES> storeys;
-    std::vector<int> nodeIds;                       // ascending
-    std::vector<std::vector<solver::T_VEC6>> nodes; // by step, then by node; global
+    T_RUN_DATA data; // the same steps as they are stored, with all displacements
 };
 
 struct T_PUSH_PROGRESS {
@@ -67,8 +67,12 @@ public:
 
     /// All results of a load case; with a static angle several. 1 done, however they ended; 0
     /// `error` says what is wrong with model, hinges or load case, `out` unchanged.
+    /// extra: displacements of the control node (m) that are steps too, beside those of the record.
     [[nodiscard]] int Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_RUN>& out,
-                          std::string& error);
+                          std::string& error, const std::vector<double>& extra = {});
+
+    /// Puts the results of a load case, as Run gives them, in place of those that the document has.
+    void Keep(std::vector<T_PUSH_RUN>& runs);
 
 private:
     struct T_PREPARED;
