@@ -2,6 +2,7 @@
 
 #include "inputfile.h"
 #include "output.h"
+#include "push/pushfirst.h"
 #include "qm_base/say.h"
 #include "qm_rps/pushover/evaluation/pushovercomparison.h"
 #include "qm_rps/pushover/report/pushoverreport.h"
@@ -105,6 +106,18 @@ EXIT_CODE EvaluateAll(CDBDoc& doc, const T_EVALUATE_OPTIONS& options,
     return Complain(EXIT_CODE::Usage, doc.Path() + ": " + Say("IDS_QM_CLI_NO_EVALUATION", only));
 }
 
+/// The load cases that the evaluations need are pushed where they have no results.
+EXIT_CODE PushEvaluated(CDBDoc& doc, const T_EVALUATE_OPTIONS& o)
+{
+    std::set<int> keys;
+    for (const auto& [key, eval] : doc.Data().Model().evaluations) {
+        int push = 0;
+        if ((o.only.empty() || eval.name == o.only) && doc.Attr().FindPolc(eval.push, push))
+            keys.insert(push);
+    }
+    return PushWhereMissing(doc, o.file, keys);
+}
+
 /// The path itself for one evaluation; for several a number before the extension.
 std::string NumberedPath(const std::string& path, std::size_t index, std::size_t count)
 {
@@ -186,6 +199,9 @@ EXIT_CODE RunCompare(const T_COMPARE_OPTIONS& o)
         return code;
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
+    if (int key = 0; doc.Attr().FindPolc(o.push, key))
+        if (const EXIT_CODE code = PushWhereMissing(doc, o.file, {key}); code != EXIT_CODE::Done)
+            return code;
     T_PUSH_COMPARISON comparison;
     CPushEvaluator evaluator(doc, RunPerfPtProcedure);
     T_FINDING refusal;
@@ -217,6 +233,7 @@ EXIT_CODE RunEvaluate(const T_EVALUATE_OPTIONS& o)
     if (const EXIT_CODE code = CheckOutputs(o.file, OutputsOf(o, count), o.overwrite);
         code != EXIT_CODE::Done)
         return code;
+    if (const EXIT_CODE code = PushEvaluated(doc, o); code != EXIT_CODE::Done) return code;
     std::vector<T_PUSH_EVALUATION> results;
     bool extras = true;
     if (const EXIT_CODE code = EvaluateAll(doc, o, results, extras); code != EXIT_CODE::Done)

@@ -1,11 +1,10 @@
 #include "push/pushcommands.h"
 
-#include "console/console.h"
 #include "inputfile.h"
 #include "output.h"
+#include "push/pushfirst.h"
 #include "push/pushtable.h"
 #include "qm_base/say.h"
-#include "qm_base/textformat.h"
 #include "qm_rps/desk/elementlist.h"
 #include "json/pushjson.h"
 
@@ -54,33 +53,6 @@ EXIT_CODE ReadNodes(CDBDoc& doc, const T_PUSH_OPTIONS& o, std::set<int>& out)
     return EXIT_CODE::Done;
 }
 
-/// Shows the step, where somebody looks at it; false: Ctrl-C.
-bool ShowStep(const T_PUSH_PROGRESS& p, const T_UNITS& units)
-{
-    if (isatty(STDERR_FILENO))
-        ShowOnTerminal(Say("IDS_QM_CLI_PUSHING", p.name, std::to_string(p.done),
-                           std::to_string(p.total),
-                           FormatText("%.4g", FromSi(p.displacement, units, kDimLength))),
-                       p.done >= p.total);
-    return !CInterrupt::IsAsked();
-}
-
-EXIT_CODE PushAll(CDBDoc& doc, const T_PUSH_OPTIONS& o, const std::vector<int>& keys,
-                  std::vector<T_PUSH_RUN>& out)
-{
-    const CInterrupt interrupt;
-    const T_UNITS units = doc.Unit().Units();
-    CPushRun push(doc);
-    for (const int key : keys) {
-        std::string error;
-        const auto progress = [&](const T_PUSH_PROGRESS& p) { return ShowStep(p, units); };
-        if (!push.Run(key, progress, out, error))
-            return Complain(EXIT_CODE::BadInput, o.file + ": " + error);
-        if (out.back().cancelled) break;
-    }
-    return EXIT_CODE::Done;
-}
-
 EXIT_CODE PrintTables(const T_PUSH_OPTIONS& o, const std::vector<T_PUSH_RUN>& runs,
                       const T_UNITS& units)
 {
@@ -121,13 +93,25 @@ T_PLOT CurvePlot(const std::vector<T_PUSH_RUN>& runs, const T_UNITS& units,
 }
 #endif
 
+/// A model file keeps the results; -o writes another file.
+EXIT_CODE Store(CDBDoc& doc, const T_PUSH_OPTIONS& o)
+{
+    if (!o.out.empty()) return SaveDocument(doc, o.out);
+    if (!IsModelFile(o.file) || o.noStore) return EXIT_CODE::Done;
+    T_FILE_ERROR error;
+    return doc.SaveModel(error) ? EXIT_CODE::Done : ReportFileError(error);
+}
+
 } // namespace
 
 EXIT_CODE RunPush(const T_PUSH_OPTIONS& o)
 {
     if (const EXIT_CODE code = CheckPlotName(o.plot); code != EXIT_CODE::Done) return code;
-    if (const EXIT_CODE code = CheckOutputs(
-            o.file, {{o.json, OUTPUT_KIND::Json}, {o.plot, OUTPUT_KIND::Picture}}, o.overwrite);
+    if (const EXIT_CODE code = CheckOutputs(o.file,
+                                            {{o.json, OUTPUT_KIND::Json},
+                                             {o.plot, OUTPUT_KIND::Picture},
+                                             {o.out, OUTPUT_KIND::Model}},
+                                            o.overwrite);
         code != EXIT_CODE::Done)
         return code;
     CDBDoc doc;
@@ -138,7 +122,8 @@ EXIT_CODE RunPush(const T_PUSH_OPTIONS& o)
     if (const EXIT_CODE code = ReadNodes(doc, o, nodes); code != EXIT_CODE::Done) return code;
     std::vector<T_PUSH_RUN> runs;
     const T_UNITS units = doc.Unit().Units();
-    if (const EXIT_CODE code = PushAll(doc, o, keys, runs); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = PushCases(doc, o.file, keys, runs); code != EXIT_CODE::Done)
+        return code;
     if (o.json != "-")
         if (const EXIT_CODE code = PrintTables(o, runs, units); code != EXIT_CODE::Done)
             return code;
@@ -148,6 +133,7 @@ EXIT_CODE RunPush(const T_PUSH_OPTIONS& o)
     if (code == EXIT_CODE::Done && !o.plot.empty())
         code = WritePicture(CurvePlot(runs, units, doc.Data().Model().styp.title), o.plot);
 #endif
+    if (code == EXIT_CODE::Done) code = Store(doc, o);
     if (code != EXIT_CODE::Done) return code;
     const bool failed = std::ranges::any_of(
         runs, [](const T_PUSH_RUN& r) { return r.status == PUSH_STATUS::Failed; });

@@ -14,7 +14,9 @@ struct T_PUSH_OPTIONS {
     std::string plot;                // capacity curves: .svg, .png or .pdf
     std::vector<std::string> hinges; // results whose hinges are printed
     std::string nodes;               // "1,5-9": displacements of these in the JSON
+    std::string out;                 // write the model with its results here (.qmdb)
     bool overwrite = false;          // files that are there
+    bool noStore = false;            // don't store the results in a model file
 };
 
 /// Done: every push came to its target or to a stop that was asked for; NotFound: one did not.

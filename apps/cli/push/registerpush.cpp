@@ -14,6 +14,9 @@ void AddPush(CLI::App& app, EXIT_CODE& code)
     sub->add_option("--plot", o->plot, Say("IDS_QM_HELP_PUSH_PLOT"));
     sub->add_option("--hinges", o->hinges, Say("IDS_QM_HELP_PUSH_HINGES"));
     sub->add_option("--nodes", o->nodes, Say("IDS_QM_HELP_PUSH_NODES"));
+    sub->add_option("-o", o->out, Say("IDS_QM_HELP_PUSH_OUT"));
     AddOverwrite(sub, o->overwrite);
+    sub->add_flag("--no-store", o->noStore, Say("IDS_QM_HELP_ANALYSE_NO_STORE"));
+    AddExample(sub, "push examples/masonry-wall/case.json --all");
     sub->callback([o, &code] { code = RunPush(*o); });
 }

@@ -1,0 +1,17 @@
+// The pushes that other commands need before they can read results.
+#pragma once
+
+#include "exitcodes.h"
+#include "qm_rps/push/pushrun.h"
+
+#include <set>
+
+/// Pushes these load cases (keys) one after the other, with progress on a terminal; Ctrl-C ends the
+/// one that runs, with its steps, and starts no other. Their results become those of the document.
+/// Where a load case asks for steps at the performance points of its evaluations, it is pushed
+/// again with these. Done, or the code to exit with after one line on stderr.
+EXIT_CODE PushCases(CDBDoc& doc, const std::string& file, const std::vector<int>& keys,
+                    std::vector<T_PUSH_RUN>& out);
+
+/// Pushes those that have no results, and says so. A case without control data stays without.
+EXIT_CODE PushWhereMissing(CDBDoc& doc, const std::string& file, const std::set<int>& keys);
