@@ -68,6 +68,7 @@ int CPushRun::PrepareNew(const T_PUSH_BASIS& basis, T_PREPARED& to, std::string&
     static_assert(static_cast<int>(PUSH_P_DELTA::Updated) ==
                   static_cast<int>(solver::P_DELTA::Updated));
     model.pDelta = static_cast<solver::P_DELTA>(basis.pDelta);
+    model.vertical = static_cast<int>(VerticalAxis(m_model));
     model.drifts = DriftsOf(m_model, m_frame, StoreysOf(m_model, m_frame, 0));
     model.mostEvents = static_cast<std::size_t>(control.mostEvents);
     solver::T_SOLVER_ERROR fault;

@@ -136,7 +136,6 @@ TEST(PushLaws, UserCurvesGiveStrengthsByAxialForce)
         EXPECT_NEAR(expected[i][1], rows[i].positive, 1e-9) << i;
         EXPECT_NEAR(expected[i][2], rows[i].negative, 1e-9) << i;
     }
-    pos[2].m = pos[3].m = 0;
     T_PHGT_D none = type;
     none.pmm->curves[1].fill({0.5, 0.5});
     EXPECT_TRUE(Build(none, {Hinge()}, error).hinges.empty());
