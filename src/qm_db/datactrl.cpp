@@ -39,18 +39,18 @@ void CDataCtrl::SetStaticResult(int loadCase, std::shared_ptr<IStaticResult> res
     ++m_revision;
 }
 
-void CDataCtrl::SetPushResult(int pushover, std::shared_ptr<IPushResult> result, int turn)
+void CDataCtrl::SetPushRuns(int pushover, const std::vector<std::shared_ptr<IPushRun>>& runs)
 {
-    const auto put = [&](auto& map, const auto& key) {
-        if (result)
-            map[key] = std::move(result);
+    T_RESULT_MAP& results = m_content.results;
+    const auto before = results.find(pushover);
+    if (before != results.end() && before->second->Run()) results.erase(before);
+    std::erase_if(m_content.turnedResults,
+                  [&](const auto& entry) { return entry.first.first == pushover; });
+    for (const std::shared_ptr<IPushRun>& run : runs)
+        if (const int turn = run->Head().turn; turn == 0)
+            results[pushover] = run;
         else
-            map.erase(key);
-    };
-    if (turn == 0)
-        put(m_content.results, pushover);
-    else
-        put(m_content.turnedResults, std::pair(pushover, turn));
+            m_content.turnedResults[{pushover, turn}] = run;
     ChangeForGood();
     ++m_revision;
 }

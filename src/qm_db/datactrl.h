@@ -19,9 +19,9 @@ public:
     /// Replaces or adds the results of one static load case; null removes them.
     void SetStaticResult(int loadCase, std::shared_ptr<IStaticResult> result);
 
-    /// Replaces or adds the results of one pushover load case, whose loads are turned that many
-    /// times by its static angle; null removes them.
-    void SetPushResult(int pushover, std::shared_ptr<IPushResult> result, int turn = 0);
+    /// Puts the runs of one pushover load case, one for each turn of its loads, in place of all
+    /// that it has; results of another solver go when there is one that is not turned.
+    void SetPushRuns(int pushover, const std::vector<std::shared_ptr<IPushRun>>& runs);
 
     /// Results of the construction stages; null where there are none.
     const std::shared_ptr<IStagedResult>& StagedResult() const { return m_content.stagedResult; }

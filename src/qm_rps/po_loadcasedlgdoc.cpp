@@ -79,8 +79,10 @@ int CPO_LoadCaseDlg::NextKey(const CDBDoc& doc)
 {
     const T_MODEL_CONTENT& content = doc.Data().Content();
     const auto last = [](const auto& table) { return table.empty() ? 0 : table.rbegin()->first; };
+    const int turned =
+        content.turnedResults.empty() ? 0 : content.turnedResults.rbegin()->first.first;
     return 1 + std::max({last(content.model.pushovers), last(content.model.poverSteps),
-                         last(content.results)});
+                         last(content.results), turned});
 }
 
 bool CPO_LoadCaseDlg::HasResults() const

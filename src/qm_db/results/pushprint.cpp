@@ -27,6 +27,12 @@ public:
         AddText(text.TakeText());
         if (text.Failed()) AddText(text.Error().text); // not finite, for example
     }
+    /// There may be many: without a text.
+    void Add(const T_PHGE_D& hinge)
+    {
+        static_assert(sizeof hinge == 2 * sizeof(int) + 48 * sizeof(double)); // nothing between
+        m_sum.AddBytes(std::as_bytes(std::span(&hinge, 1)));
+    }
     template <class R>
     void Add(const T_TABLE<R>& table)
     {
@@ -37,6 +43,7 @@ public:
         Add(std::uint64_t{table.size()});
     }
     void Add(std::uint64_t word) { m_sum.AddWord(word); }
+    void AddNumbers(std::span<const double> values) { m_sum.AddBytes(std::as_bytes(values)); }
     std::uint64_t Value() const { return m_sum.Value(); }
 
 private:
@@ -76,7 +83,8 @@ std::uint64_t LoadsOf(const T_MODEL& model, const T_POLC_D& push, const T_POGC_D
         if (const auto it = model.loadCases.find(key); it != model.loadCases.end())
             sum.Add(it->second);
     }
-    sum.Add(model.nodes); // their masses
+    for (const auto& [id, node] : model.nodes)
+        sum.AddNumbers(node.mass);
     sum.Add(model.storeys);
     for (const T_POLC_PATTERN& row : push.patterns) {
         const auto mode = model.modes.find(row.number);

@@ -146,8 +146,11 @@ int CPushRun::RunCase(T_PREPARED& on, const T_PUSH_CASE& c, const PUSH_PROGRESS_
 
 void CPushRun::Keep(std::vector<T_PUSH_RUN>& runs)
 {
-    for (T_PUSH_RUN& run : runs)
-        m_doc.Data().SetPushResult(run.key, MakePushRun(run.data), run.turn);
+    std::map<int, std::vector<std::shared_ptr<IPushRun>>> byCase;
+    for (const T_PUSH_RUN& run : runs)
+        byCase[run.key].push_back(MakePushRun(run.data));
+    for (const auto& [key, all] : byCase)
+        m_doc.Data().SetPushRuns(key, all);
 }
 
 int CPushRun::Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_RUN>& out,

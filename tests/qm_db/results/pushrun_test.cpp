@@ -263,8 +263,10 @@ TEST(PushRun, IsReadInCurrentUnits)
     turned.head.turn = 1;
     turned.head.control = {1, 0, 0, 0, 0, 0};
     EXPECT_FALSE(doc.Data().IsModified());
-    doc.Data().SetPushResult(1, MakePushRun(run));
-    doc.Data().SetPushResult(1, MakePushRun(turned), 1);
+    T_RUN_DATA old = turned;
+    old.head.turn = 2;
+    doc.Data().SetPushRuns(1, {MakePushRun(old)});
+    doc.Data().SetPushRuns(1, {MakePushRun(run), MakePushRun(turned)});
     EXPECT_TRUE(doc.Data().IsModified());
     CPostCtrl& post = doc.Post();
     constexpr double kip = 4448.2216152605, in = 0.0254;
@@ -297,7 +299,7 @@ TEST(PushRun, IsReadInCurrentUnits)
     ASSERT_TRUE(post.SelectPushover(1, 1) && post.SelectStep(2) &&
                 post.GetDispNew(20, displacement));
     EXPECT_DOUBLE_EQ(2 / in, displacement);
-    EXPECT_EQ(0, post.SelectPushover(1, 2));
+    EXPECT_EQ(0, post.SelectPushover(1, 2)); // gone with the runs before
     ASSERT_EQ(1, post.SelectPushover(3));
     EXPECT_EQ(0, post.GetRunSteps(steps)); // another program's
     EXPECT_TRUE(steps.empty());
