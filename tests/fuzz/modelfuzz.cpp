@@ -193,6 +193,23 @@ void ReadEverything(const T_MODEL_CONTENT& content)
         for (const double value : data.baseReaction)
             Expect(std::isfinite(value), "results are finite");
     }
+    const auto readRun = [](IPushResult& result) {
+        T_RUN_DATA data;
+        std::string error;
+        std::vector<T_DOF6> moves;
+        std::vector<T_RUN_STATE> states;
+        IPushRun* const run = result.Run();
+        if (!run) return;
+        if (!ReadWholeRun(*run, data, error)) ExpectOneLine(error);
+        for (const int node : data.nodes)
+            Expect(run->ReadNode(node, moves), "a node that is listed is read");
+        for (std::size_t i = 0; i < data.hinges.size(); ++i)
+            Expect(run->ReadHinge(i, states), "a hinge that is listed is read");
+    };
+    for (const auto& [key, result] : content.results)
+        readRun(*result);
+    for (const auto& [key, result] : content.turnedResults)
+        readRun(*result);
     for (const auto& [key, result] : content.staticResults) {
         T_STATIC_DATA data;
         if (!result->ReadAll(data)) ExpectOneLine(result->Error());

@@ -114,6 +114,15 @@ T_MODEL_CONTENT RichContent()
     px.displacement = {{7, {1e-3, 1234.56789, -0.0}}, {2, {0.1, 0.2, Limits::denorm_min()}}};
     content.results[1] = MakePushResult(px);
     content.results[3] = MakePushResult({{1.0}, {2.0}, {}});
+    T_RUN_DATA run;
+    run.head = {2, 30.0, {0.5, -0.0, 0, 0, 0, 0}, {1, 2, 3, 4}, {{}, 0, 1.0, 0.5, 4}};
+    run.nodes = {2, 7};
+    run.hinges = {{4, 0.5, 5}};
+    run.steps = {{0, 0.5, 0.1, 2, {1, 2, 3, 4, 5, 6}, 1e-15, false}, {0, 1, 0.5, 4, {}, 0, true}};
+    run.displacement = {{{1}, {2}}, {{-0.0}, {Limits::max()}}};
+    run.states = {{{0.01, 100, -5, 1}}, {{0.02, 110, -6, -2}}};
+    run.events = {{0, 0.4, 0.05, 1, {}, {{0, {}, 1, false}}}};
+    content.turnedResults[{1, 2}] = MakePushRun(run);
     return content;
 }
 
@@ -144,7 +153,17 @@ T_MODEL_CONTENT GridContent(int nodes, int steps)
 
 bool SameContent(const T_MODEL_CONTENT& a, const T_MODEL_CONTENT& b)
 {
-    if (a.model != b.model || a.results.size() != b.results.size()) return false;
+    if (a.model != b.model || a.results.size() != b.results.size() ||
+        a.turnedResults.size() != b.turnedResults.size())
+        return false;
+    for (const auto& [key, source] : a.turnedResults) {
+        const auto other = b.turnedResults.find(key);
+        T_RUN_DATA of[2];
+        std::string error;
+        if (other == b.turnedResults.end() || !ReadWholeRun(*source->Run(), of[0], error) ||
+            !ReadWholeRun(*other->second->Run(), of[1], error) || of[0] != of[1])
+            return false;
+    }
     for (const auto& [key, source] : a.results) {
         const auto other = b.results.find(key);
         if (other == b.results.end() || !SameResult(*source, *other->second)) return false;
