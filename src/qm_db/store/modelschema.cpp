@@ -123,8 +123,8 @@ constexpr const char* kTables[] = {
     // of a static one from part 4 on. chunk and step count from 0 and are 0 where they mean
     // nothing; step of a result of construction stages is its key in staged_results, from 1. Of
     // runs of a push, whose key in push_results stands in pushover: 9 node ids, 10 components of
-    // hinges, 11 steps, 12 events, 13 turns of hinges in them; by 64 and step 14 displacements of
-    // nodes, 15 states of components.
+    // hinges, 11 steps, 12 events, 13 turns of hinges in them; by step 14 displacements of 80
+    // nodes, 15 states of 128 components.
     "CREATE TABLE result_blocks(pushover INTEGER NOT NULL, part INTEGER NOT NULL, "
     "chunk INTEGER NOT NULL, step INTEGER NOT NULL, count INTEGER NOT NULL, "
     "width INTEGER NOT NULL, byte_order TEXT NOT NULL, checksum INTEGER NOT NULL, "

@@ -215,7 +215,7 @@ private:
             const std::span<const double> all = Flat(numbers);
             CheckFinite(all);
             for (int chunk = 0; chunk < RunChunks(m_row, part); ++chunk) {
-                const auto from = static_cast<std::size_t>(chunk * kRunBlock * part.width);
+                const auto from = static_cast<std::size_t>(chunk * part.block * part.width);
                 const auto size = static_cast<std::size_t>(RunChunkNumbers(m_row, part, chunk));
                 m_blocks.Write(RunKey(m_row, partKey, chunk, step), all.subspan(from, size));
             }
@@ -257,13 +257,13 @@ T_RUN_ROW RowOf(const CRecordRow& row)
 
 int RunChunks(const T_RUN_ROW& row, const T_RUN_PART& part)
 {
-    return part.bySteps ? (row.*part.count + kRunBlock - 1) / kRunBlock : 1;
+    return part.block == 0 ? 1 : (row.*part.count + part.block - 1) / part.block;
 }
 
 int RunChunkNumbers(const T_RUN_ROW& row, const T_RUN_PART& part, int chunk)
 {
-    const int left = row.*part.count - chunk * kRunBlock;
-    return (part.bySteps ? std::min(left, kRunBlock) : row.*part.count) * part.width;
+    const int left = row.*part.count - chunk * part.block;
+    return (part.block == 0 ? left : std::min(left, part.block)) * part.width;
 }
 
 void WriteRuns(const CSqliteDb& db, const T_MODEL& model, const T_RESULT_MAP& results,
@@ -304,7 +304,7 @@ double BytesOf(const T_RUN_ROW& row)
     double bytes = 0.0;
     for (const T_RUN_PART& part : kRunParts)
         bytes += 1.0 * (row.*part.count) * part.width * part.bytes *
-                 (part.bySteps ? 1.0 * row.steps : 1.0);
+                 (part.block == 0 ? 1.0 : 1.0 * row.steps);
     return bytes;
 }
 
@@ -316,7 +316,7 @@ void CheckRunBlocks(const CSqliteDb& db, const std::vector<T_RUN_ROW>& rows)
     for (const T_RUN_ROW& row : rows) // in the order of their keys
         for (const T_RUN_PART& part : kRunParts)
             for (int chunk = 0; chunk < RunChunks(row, part); ++chunk)
-                for (int step = 0; step < (part.bySteps ? row.steps : 1); ++step) {
+                for (int step = 0; step < (part.block == 0 ? 1 : row.steps); ++step) {
                     const T_BLOCK_KEY key = RunKey(row, part.part, chunk, step);
                     if (!stmt.Step()) ThrowBadBlock(key);
                     CheckedBlock(stmt, key, RunChunkNumbers(row, part, chunk));

@@ -1,7 +1,8 @@
 // Runs of a push in the model file: a row of "push_results" each, and blocks in the table of result
 // blocks. One block holds all steps, events, turns of hinges, components of hinges and node ids;
-// displacements and states stand by 64 nodes or components and step, so that one of them over all
-// steps is one short run of the table, and one step a few blocks.
+// displacements and states stand by step and so many nodes or components as fill a page of the
+// file, so that one of them over all steps is one short run of the table, and one step a few
+// blocks.
 #pragma once
 
 #include "qm_db/results/pushrun.h"
@@ -9,8 +10,6 @@
 
 #include <array>
 #include <cmath>
-
-inline constexpr int kRunBlock = 64; // nodes or components of hinges in one block
 
 /// A row of the table.
 struct T_RUN_ROW {
@@ -20,22 +19,22 @@ struct T_RUN_ROW {
     T_RUN_HEAD head;
 };
 
-/// A part of a run: so many things with so many numbers each, in one block or by 64 and step.
+/// A part of a run: so many things with so many numbers each, in one block, or by step.
 struct T_RUN_PART {
     BLOCK_PART part;
     int T_RUN_ROW::*count;
     int width;
-    bool bySteps;
     int bytes = 8; // of a number
+    int block = 0; // things in a block of each step; 0: one block holds all
 };
 inline constexpr std::array<T_RUN_PART, 7> kRunParts{
-    {{BLOCK_PART::RunNodes, &T_RUN_ROW::nodes, 1, false, 4},
-     {BLOCK_PART::RunHinges, &T_RUN_ROW::hinges, 3, false},
-     {BLOCK_PART::RunSteps, &T_RUN_ROW::steps, 12, false},
-     {BLOCK_PART::RunEvents, &T_RUN_ROW::events, 11, false},
-     {BLOCK_PART::RunTurns, &T_RUN_ROW::turns, 4, false, 4},
-     {BLOCK_PART::RunDisplacement, &T_RUN_ROW::nodes, 6, true},
-     {BLOCK_PART::RunState, &T_RUN_ROW::hinges, 4, true}}};
+    {{BLOCK_PART::RunNodes, &T_RUN_ROW::nodes, 1, 4},
+     {BLOCK_PART::RunHinges, &T_RUN_ROW::hinges, 3},
+     {BLOCK_PART::RunSteps, &T_RUN_ROW::steps, 12},
+     {BLOCK_PART::RunEvents, &T_RUN_ROW::events, 11},
+     {BLOCK_PART::RunTurns, &T_RUN_ROW::turns, 4, 4},
+     {BLOCK_PART::RunDisplacement, &T_RUN_ROW::nodes, 6, 8, 80},
+     {BLOCK_PART::RunState, &T_RUN_ROW::hinges, 4, 8, 128}}};
 
 constexpr const T_RUN_PART& RunPartOf(BLOCK_PART part)
 {

@@ -147,7 +147,7 @@ template <class F>
 void CBlockPushRun::ForEachStep(BLOCK_PART partKey, int at, T_CHUNK& kept, const F& f) const
 {
     const T_RUN_PART& part = RunPartOf(partKey);
-    const int chunk = at / kRunBlock;
+    const int chunk = at / part.block;
     const int numbers = RunChunkNumbers(m_row, part, chunk);
     if (kept.chunk != chunk) {
         kept = {};
@@ -157,7 +157,7 @@ void CBlockPushRun::ForEachStep(BLOCK_PART partKey, int at, T_CHUNK& kept, const
         kept.chunk = chunk;
     }
     const auto width = static_cast<std::size_t>(part.width);
-    for (auto from = static_cast<std::size_t>(at % kRunBlock) * width; from < kept.values.size();
+    for (auto from = static_cast<std::size_t>(at % part.block) * width; from < kept.values.size();
          from += static_cast<std::size_t>(numbers))
         f(std::span(kept.values).subspan(from, width));
 }

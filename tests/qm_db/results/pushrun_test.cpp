@@ -16,29 +16,29 @@ namespace {
 using O = solver::PUSH_OUTCOME;
 using H = solver::HINGE_TURN;
 
-/// 130 nodes (10, 20 ...) and 70 components, so that both go over more than one block.
+/// 170 nodes (10, 20 ...) and 140 components, so that both go over more than one block.
 T_RUN_DATA LongRun(int steps)
 {
     T_RUN_DATA run;
     run.head = {0, 0.0, {0, 0, 0, 0, 0, 0}, {1, 2, 3, ~0ULL}, {O::SnapBack, 1, -0.0, 0.25, 7}};
     run.head.control[1] = 1.0;
-    for (int n = 1; n <= 130; ++n)
+    for (int n = 1; n <= 170; ++n)
         run.nodes.push_back(10 * n);
-    for (int h = 0; h < 70; ++h)
+    for (int h = 0; h < 140; ++h)
         run.hinges.push_back({h / 2 + 1, 0.5 * (h % 3), h % 6});
     for (int s = 1; s <= steps; ++s) {
         const double v = s;
         run.steps.push_back({s % 2, v / 8, v / 4, -v, {v, -v, 3, 4, 5, 6}, 1e-12 * v, s == 2});
         auto& shape = run.displacement.emplace_back();
-        for (int n = 0; n < 130; ++n)
+        for (int n = 0; n < 170; ++n)
             shape.push_back({v, 1000.0 * n + v, -0.0, 1.0 / (n + 1), 5, 6});
         auto& states = run.states.emplace_back();
-        for (int h = 0; h < 70; ++h)
+        for (int h = 0; h < 140; ++h)
             states.push_back({0.001 * h, v * h, -5.0, h % 7 - 3});
     }
     run.events = {
         {-1, 0.5, 0.0, 0.0, {}, {}},
-        {0, 1.5, 0.25, 2.0, {1, 2, 3, 4, 5, 6}, {{69, H::Point, 2, false}, {0, H::Unload}}},
+        {0, 1.5, 0.25, 2.0, {1, 2, 3, 4, 5, 6}, {{139, H::Point, 2, false}, {0, H::Unload}}},
         {1, 2.5, 0.5, 3.0, {}, {{3, H::Reload, 0, true}}}};
     return run;
 }
@@ -132,12 +132,12 @@ TEST(PushRun, ComesBackFromTheModelFileWholeAndInPart)
         std::vector<T_DOF6> u;
         std::vector<T_RUN_STATE> s;
         std::vector<double> along, base;
-        ASSERT_EQ(1, r.ReadDisplacements(1290, along)); // in the third block, in Y
-        EXPECT_EQ((std::vector<double>{128001, 128002, 128003, 128004, 128005}), along);
+        ASSERT_EQ(1, r.ReadDisplacements(1690, along)); // in the third block, in Y
+        EXPECT_EQ((std::vector<double>{168001, 168002, 168003, 168004, 168005}), along);
         ASSERT_EQ(1, r.ReadBaseReactions(base));
         EXPECT_EQ((std::vector<double>{-1, -2, -3, -4, -5}), base);
-        ASSERT_EQ(1, r.ReadHinge(64, s));
-        EXPECT_EQ((T_RUN_STATE{0.001 * 64, 4.0 * 64, -5.0, -2}), s.at(3));
+        ASSERT_EQ(1, r.ReadHinge(128, s));
+        EXPECT_EQ((T_RUN_STATE{0.001 * 128, 4.0 * 128, -5.0, -1}), s.at(3));
         ASSERT_EQ(1, r.ReadStates(2, s));
         EXPECT_EQ(run.states[1], s);
         ASSERT_EQ(1, r.ReadShape(5, u));
@@ -145,7 +145,7 @@ TEST(PushRun, ComesBackFromTheModelFileWholeAndInPart)
         EXPECT_EQ(0, r.ReadShape(6, u));
         EXPECT_TRUE(u.empty());
         EXPECT_EQ(0, r.ReadStates(0, s));
-        EXPECT_EQ(0, r.ReadHinge(70, s));
+        EXPECT_EQ(0, r.ReadHinge(140, s));
         EXPECT_EQ(0, r.ReadNode(11, u));
         EXPECT_FALSE(r.HasNode(11));
     }
@@ -166,8 +166,8 @@ TEST(PushRun, ReadsTheBlocksOfWhatIsAskedForAlone)
                  std::to_string(static_cast<int>(part)) + " AND chunk = " + std::to_string(chunk) +
                  " AND step = " + std::to_string(step));
     };
-    spoil(BLOCK_PART::RunDisplacement, 1, 2); // nodes 650 to 1280 in step 3
-    spoil(BLOCK_PART::RunState, 0, 0);        // components 0 to 63 in step 1
+    spoil(BLOCK_PART::RunDisplacement, 1, 2); // nodes 810 to 1600 in step 3
+    spoil(BLOCK_PART::RunState, 0, 0);        // components 0 to 127 in step 1
     T_TABLE_SUMS sums;
     const std::vector<T_RUN_ROW> rows = ReadRunRows(*db, sums);
     ASSERT_EQ(1u, rows.size());
@@ -176,18 +176,18 @@ TEST(PushRun, ReadsTheBlocksOfWhatIsAskedForAlone)
     std::vector<T_RUN_STATE> s;
     std::vector<T_RUN_STEP> steps;
     std::vector<T_RUN_EVENT> events;
-    EXPECT_TRUE(run.ReadNode(640, u) && run.ReadNode(1290, u) && run.ReadShape(2, u));
-    EXPECT_TRUE(run.ReadHinge(64, s) && run.ReadStates(2, s));
+    EXPECT_TRUE(run.ReadNode(800, u) && run.ReadNode(1610, u) && run.ReadShape(2, u));
+    EXPECT_TRUE(run.ReadHinge(128, s) && run.ReadStates(2, s));
     EXPECT_TRUE(run.ReadSteps(steps) && run.ReadEvents(events));
     const auto damage = [&](const char* part, const char* chunk, const char* step) {
         const std::string block = Say("IDS_QM_DB_DAMAGE_BLOCK", "1", Say(part), chunk, step);
         return Say("IDS_QM_DB_FILE_DAMAGED", path, block);
     };
-    EXPECT_EQ(0, run.ReadNode(650, u));
+    EXPECT_EQ(0, run.ReadNode(810, u));
     EXPECT_EQ(damage("IDS_QM_DB_PART_DISPLACEMENTS", "2", "3"), run.Error());
     EXPECT_EQ(0, run.ReadShape(3, u));
     EXPECT_TRUE(u.empty());
-    EXPECT_EQ(0, run.ReadHinge(63, s));
+    EXPECT_EQ(0, run.ReadHinge(127, s));
     EXPECT_EQ(damage("IDS_QM_DB_PART_HINGE_STATES", "1", "1"), run.Error());
     EXPECT_EQ(0, run.ReadStates(1, s));
 
