@@ -1,0 +1,169 @@
+// Where the stored steps of a push lie, and where it stops before its target.
+#include "qm_solver/push/pushrun.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace solver {
+
+namespace {
+
+constexpr double kOnTarget = 1e-12; // of the way to the target
+
+} // namespace
+
+double CPushRun::Present(const T_PUSH_STAGE& stage) const
+{
+    if (stage.control == PUSH_CONTROL::LoadFactor) return m_path->Factor();
+    double most = m_path->Watched(m_nodeWatch[0]);
+    for (const std::size_t w : m_nodeWatch)
+        if (m_sign * m_path->Watched(w) > m_sign * most) most = m_path->Watched(w);
+    return most;
+}
+
+void CPushRun::MakeTargets(const T_PUSH_STAGE& stage)
+{
+    const bool byLoad = stage.control == PUSH_CONTROL::LoadFactor;
+    m_sign = byLoad || stage.target >= 0.0 ? 1.0 : -1.0;
+    m_start = Present(stage);
+    if (m_isFirst) m_origin = m_start;
+    m_isFirst = false;
+    if (!byLoad && stage.target < m_start) m_sign = -1.0;
+    m_peak = {};
+    m_targets.clear();
+    m_target = 0;
+    const double way = stage.target - m_start;
+    for (const double fraction : stage.steps)
+        m_targets.push_back({fraction == 1.0 ? stage.target : m_start + fraction * way, false});
+    if (m_targets.empty()) m_targets.push_back({stage.target, false});
+    for (const double value : stage.additional)
+        m_targets.push_back({value, true});
+    const auto before = [&](const T_TARGET& a, const T_TARGET& b) {
+        return m_sign * a.value < m_sign * b.value;
+    };
+    std::stable_sort(m_targets.begin(), m_targets.end(), before);
+    const double same = kOnTarget * std::fabs(way);
+    std::vector<T_TARGET> apart;
+    for (const T_TARGET& t : m_targets) {
+        if (m_sign * (t.value - m_start) <= same || m_sign * (t.value - stage.target) > same)
+            continue; // behind the start, beyond the end
+        if (!apart.empty() && std::fabs(t.value - apart.back().value) <= same)
+            apart.back().additional |= t.additional;
+        else
+            apart.push_back(t);
+    }
+    m_targets = std::move(apart);
+}
+
+/// Along the rates, to the next stored step; infinite where the path leads away from it.
+double CPushRun::ToTarget(const T_PUSH_STAGE& stage) const
+{
+    const double target = m_targets[m_target].value;
+    double first = CHingeBackbone::kFar;
+    const auto take = [&](double value, double rate) {
+        if (m_sign * rate > 0.0)
+            first = std::min(first, std::max(0.0, m_sign * (target - value)) / (m_sign * rate));
+    };
+    if (stage.control == PUSH_CONTROL::LoadFactor)
+        take(m_path->Factor(), m_path->Rate().factor);
+    else
+        for (const std::size_t w : m_nodeWatch)
+            take(m_path->Watched(w), m_path->WatchRate(w));
+    return first;
+}
+
+double CPushRun::Reaction(const T_PUSH_STAGE& stage) const
+{
+    return -Base()[static_cast<std::size_t>(stage.direction)];
+}
+
+double CPushRun::ReactionRate(const T_PUSH_STAGE& stage) const
+{
+    return m_path->Rate().factor * m_structure.Loads(m_structure.LoadCount() - 1)
+                                       .sum[static_cast<std::size_t>(stage.direction)];
+}
+
+/// What the supports give, from the loads.
+T_VEC6 CPushRun::Base() const
+{
+    T_VEC6 base{};
+    for (std::size_t l = 0; l < m_path->Factors().size(); ++l)
+        for (std::size_t d = 0; d < 6; ++d)
+            base[d] -= m_path->Factors()[l] * m_structure.Loads(l).sum[d];
+    return base;
+}
+
+/// Along the rates, to the first of the stops that were asked for; `end` is filled for it.
+double CPushRun::ToStop(const T_PUSH_STAGE& stage, T_PUSH_END& end) const
+{
+    double first = CHingeBackbone::kFar;
+    const auto take = [&](double distance, double rate, PUSH_OUTCOME outcome, long hinge,
+                          long drift) {
+        if (!(rate > 0.0) || distance / rate >= first) return;
+        first = std::max(0.0, distance) / rate;
+        end.outcome = outcome;
+        end.hinge = hinge;
+        end.drift = drift;
+    };
+    const T_PUSH_STOPS& stops = stage.stops;
+    for (std::size_t d = 0; d < m_driftWatch.size() && stops.drift > 0.0; ++d) {
+        const auto [top, below] = m_driftWatch[d];
+        const bool onGround = below == T_PUSH_DRIFT::kGround;
+        const double height = m_model.drifts[d].height;
+        const double drift =
+            (m_path->Watched(top) - (onGround ? 0.0 : m_path->Watched(below))) / height;
+        const double rate =
+            (m_path->WatchRate(top) - (onGround ? 0.0 : m_path->WatchRate(below))) / height;
+        for (const double sign : {1.0, -1.0})
+            take(stops.drift - sign * drift, sign * rate, PUSH_OUTCOME::DriftStop, -1,
+                 static_cast<long>(d));
+    }
+    for (std::size_t h = 0; h < m_model.hinges.size() && stops.mark >= 0; ++h)
+        for (std::size_t l = 0; l < m_model.hinges[h].laws.size(); ++l) {
+            const T_HINGE_LAW& law = m_model.hinges[h].laws[l];
+            double rate = 0.0;
+            const double deformation = m_path->Deformation(h, l, rate);
+            for (const double sign : {1.0, -1.0}) {
+                const auto& marks = (sign > 0.0 ? law.positive : law.negative).marks;
+                if (marks.size() > static_cast<std::size_t>(stops.mark))
+                    take(marks[static_cast<std::size_t>(stops.mark)] - sign * deformation,
+                         sign * rate, PUSH_OUTCOME::MarkStop, static_cast<long>(h), -1);
+            }
+        }
+    if (stops.fractionOfPeak > 0.0 && m_peak.reaction > 0.0) {
+        const double sign = m_sign;
+        take(sign * Reaction(stage) - stops.fractionOfPeak * m_peak.reaction,
+             -sign * ReactionRate(stage), PUSH_OUTCOME::PeakFractionStop, -1, -1);
+    }
+    return first;
+}
+
+/// Stops that a change of direction brings, and those of hinges that have just turned.
+bool CPushRun::StopsHere(const T_PUSH_STAGE& stage, T_PUSH_END& end)
+{
+    m_peak.reaction = std::max(m_peak.reaction, m_sign * Reaction(stage));
+    const T_PUSH_STOPS& stops = stage.stops;
+    const double moved = m_path->WatchRate(m_nodeWatch[0]);
+    if (moved != 0.0) {
+        const double tangent = ReactionRate(stage) / moved;
+        if (m_peak.first == 0.0) m_peak.first = tangent;
+        if (stops.stiffnessRatio > 0.0 && tangent <= stops.stiffnessRatio * m_peak.first) {
+            end.outcome = PUSH_OUTCOME::StiffnessStop;
+            return true;
+        }
+    }
+    if (!stops.strengthLoss && !stops.lastPoint) return false;
+    for (const CPushFlow& flow : m_path->Flows().flows) {
+        const CHingeBackbone& backbone = m_path->Flows().backbones[flow.backbone];
+        const bool lost = stops.strengthLoss && backbone.LosesStrength();
+        const bool beyond = stops.lastPoint && backbone.VertexCount() > 1 &&
+                            backbone.Vertex() >= backbone.VertexCount();
+        if (!lost && !beyond) continue;
+        end.outcome = lost ? PUSH_OUTCOME::StrengthLossStop : PUSH_OUTCOME::LastPointStop;
+        end.hinge = static_cast<long>(flow.hinge);
+        return true;
+    }
+    return false;
+}
+
+} // namespace solver
