@@ -1,6 +1,5 @@
 // Hinge laws on structures of one or two members, against forces worked out by hand.
-#include "frames.h"
-#include "qm_solver/pushsolver.h"
+#include "pushframes.h"
 
 #include <gtest/gtest.h>
 
@@ -28,56 +27,13 @@ T_PUSH_MODEL Bar(T_HINGE_SIDE positive, T_HINGE_SIDE negative, double spring = 0
     return model;
 }
 
-T_HINGE_SIDE Side(std::vector<T_BACKBONE_POINT> points, UNLOADING unloading = UNLOADING::Elastic)
-{
-    T_HINGE_SIDE side;
-    side.points = std::move(points);
-    side.unloading = unloading;
-    return side;
-}
-
-T_PUSH_STAGE PushTo(double target, std::size_t node = 1, int direction = 0)
-{
-    T_PUSH_STAGE stage;
-    T_NODAL_LOAD load;
-    load.node = node;
-    load.load[static_cast<std::size_t>(direction)] = 1.0;
-    stage.loads.nodal.push_back(load);
-    stage.node = node;
-    stage.direction = direction;
-    stage.target = target;
-    return stage;
-}
-
-struct T_RUN {
-    std::vector<T_PUSH_STEP> steps;
-    std::vector<T_PUSH_EVENT> events;
-    T_PUSH_END end;
-    T_SOLVER_ERROR error;
-    int done = 0;
-};
-
-T_RUN Pushed(const T_PUSH_MODEL& model, std::vector<T_PUSH_STAGE> stages)
-{
-    T_RUN run;
-    CPushSolver solver;
-    T_PUSH_SINK sink;
-    sink.step = [&](const T_PUSH_STEP& step) {
-        run.steps.push_back(step);
-        return true;
-    };
-    sink.event = [&](const T_PUSH_EVENT& event) { run.events.push_back(event); };
-    run.done = solver.Prepare(model, run.error) && solver.Run(stages, sink, run.end, run.error);
-    return run;
-}
-
 /// Forces of the first hinge at the ends of pushes to these displacements, one after the other.
 std::vector<double> Forces(const T_PUSH_MODEL& model, std::span<const double> places)
 {
     std::vector<T_PUSH_STAGE> stages;
     for (const double u : places)
         stages.push_back(PushTo(u));
-    const T_RUN run = Pushed(model, stages);
+    const T_PUSHED run = Pushed(model, stages);
     EXPECT_TRUE(run.done) << run.error.reason.key;
     EXPECT_EQ(run.end.outcome, PUSH_OUTCOME::Reached)
         << run.end.displacement << " stage " << run.end.stage;
@@ -147,22 +103,6 @@ TEST(PushLaws, FollowsEveryLawForwardsAndBack)
         ExpectForces(c);
 }
 
-/// A column of length 2 along Z, clamped below; E I 100 about both axes. Hinges at the base unless
-/// placed otherwise.
-T_PUSH_MODEL Column()
-{
-    T_PUSH_MODEL model;
-    model.frame = Empty();
-    AddNode(model.frame, {0, 0, 0});
-    AddNode(model.frame, {0, 0, 2});
-    Fix(model.frame, 0, {0, 1, 2, 3, 4, 5});
-    Join(model.frame, ELEMENT_KIND::Beam, 0, 1);
-    model.frame.materials[0].E = 100.0;
-    model.frame.sections[0].Iy = model.frame.sections[0].Iz = 1.0;
-    model.frame.sections[0].A = 1e4;
-    return model;
-}
-
 TEST(PushLaws, BendsAboutBothAxesWithinOnePolygon)
 {
     // The polygon has its 16 vertices on the circle of radius 100: at 45 degrees it carries 100,
@@ -178,7 +118,7 @@ TEST(PushLaws, BendsAboutBothAxesWithinOnePolygon)
         model.hinges.push_back(hinge);
         T_PUSH_STAGE stage = PushTo(3.0);
         stage.loads.nodal[0].load = {std::cos(angle), std::sin(angle), 0, 0, 0, 0};
-        const T_RUN run = Pushed(model, {stage});
+        const T_PUSHED run = Pushed(model, {stage});
         ASSERT_TRUE(run.done) << run.error.reason.key;
         ASSERT_EQ(run.steps.size(), 1u);
         EXPECT_NEAR(2.0 * run.steps[0].loadFactor, moment, 1e-8) << angle;
@@ -198,7 +138,7 @@ TEST(PushLaws, StrengthFollowsTheAxialForce)
         model.hinges = {hinge};
         T_PUSH_STAGE stage = PushTo(3.0);
         stage.loads.nodal[0].load = {1.0, 0, 0.5, 0, 0, 0};
-        const T_RUN run = Pushed(model, {stage});
+        const T_PUSHED run = Pushed(model, {stage});
         ASSERT_TRUE(run.done) << run.error.reason.key;
         EXPECT_NEAR(run.end.loadFactor, 100.0 / 2.25, 1e-8);
         // Flow in rotations leaves the column its elastic length; normal flow lengthens it by the
@@ -209,7 +149,7 @@ TEST(PushLaws, StrengthFollowsTheAxialForce)
         // Hardening, 50 a radian times the present strength over 100:
         model.hinges[0].laws[0].positive = model.hinges[0].laws[0].negative =
             Side({{0, 100}, {10, 600}});
-        const T_RUN hard = Pushed(model, {stage});
+        const T_PUSHED hard = Pushed(model, {stage});
         const double axial = 0.5 * hard.end.loadFactor;
         const double turned = std::fabs(hard.steps[0].hinges[0].deformation);
         EXPECT_NEAR(2.0 * hard.end.loadFactor, (1.0 - axial / 200.0) * (100.0 + 50.0 * turned),
@@ -233,7 +173,7 @@ TEST(PushLaws, SpreadsPlasticityOverTheIntegrationPoints)
     }
     const double turned[] = {2.5 / 3.0, 0.5 * 4.0 / 3.0};
     const double tip = 40.0 * 8.0 / 300.0 + turned[0] * 2.0 + turned[1] * 1.0;
-    const T_RUN run = Pushed(model, {PushTo(tip)});
+    const T_PUSHED run = Pushed(model, {PushTo(tip)});
     ASSERT_TRUE(run.done) << run.error.reason.key;
     EXPECT_NEAR(run.end.loadFactor, 40.0, 1e-9);
     EXPECT_NEAR(std::fabs(run.steps[0].hinges[0].deformation), turned[0], 1e-10);
@@ -259,7 +199,7 @@ TEST(PushLaws, SpringsAndLinksYield)
     spring.element = 1;
     spring.laws.push_back({0, Side({{0, 50}}), free, 0.0, {}});
     model.hinges = {link, spring};
-    const T_RUN there = Pushed(model, {PushTo(0.4), PushTo(-0.2)});
+    const T_PUSHED there = Pushed(model, {PushTo(0.4), PushTo(-0.2)});
     ASSERT_TRUE(there.done) << there.error.reason.key;
     ASSERT_EQ(there.steps.size(), 2u);
     EXPECT_NEAR(there.steps[0].loadFactor, 80.0, 1e-9); // both have yielded
