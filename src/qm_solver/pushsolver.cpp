@@ -103,6 +103,7 @@ int CPushSolver::Forces(const T_PUSH_STEP& step, T_RESULT& out, T_SOLVER_ERROR& 
         error = NotPrepared();
         return 0;
     }
+    m_state->structure.Stiffen();
     m_state->structure.Inside(*state, step, out);
     return 1;
 }

@@ -122,6 +122,52 @@ void CPushStructure::Balance(const T_PUSH_STATE& state, std::span<const double> 
     step.residual = m_largest > 0.0 ? worst / m_largest : worst;
 }
 
+void CPushStructure::AddSides(const T_PUSH_STATE& state, std::span<double> side) const
+{
+    for (std::size_t l = 0; l < state.factors.size(); ++l)
+        for (std::size_t i = 0; i < side.size(); ++i)
+            side[i] += state.factors[l] * m_loads[l].side[i];
+    for (std::size_t r = 0; r < RowCount(); ++r)
+        if (const double q = state.plastic[r]; q != 0.0)
+            for (std::size_t k = m_termFrom[r]; k < m_termFrom[r + 1]; ++k)
+                side[static_cast<std::size_t>(m_terms[k].index)] += q * m_terms[k].factor;
+}
+
+void CPushStructure::TakeDisplacements(const T_PUSH_STATE& state, std::span<const double> unknowns,
+                                       std::span<double> full) const
+{
+    m_dofs.Expand(unknowns, full);
+    for (std::size_t l = 0; l < state.factors.size(); ++l)
+        if (const auto settled = m_loads[l].loads->Settled(); !settled.empty())
+            for (std::size_t i = 0; i < full.size(); ++i)
+                full[i] += state.factors[l] * settled[i];
+}
+
+CPushStructure::T_FAULT CPushStructure::Solve(const T_PUSH_STATE& state,
+                                              std::vector<double>& unknowns,
+                                              std::vector<double>& forces)
+{
+    const T_FRAME& frame = m_model.frame;
+    unknowns.assign(m_dofs.EquationCount(), 0.0);
+    AddSides(state, unknowns);
+    if (auto fault = Solve(unknowns, 1)) return fault;
+    std::vector<double> full(m_dofs.FullCount());
+    TakeDisplacements(state, unknowns, full);
+    forces.assign(RowCount(), 0.0);
+    double tension = 0.0;
+    for (std::size_t e = 0; e < frame.elements.size(); ++e) {
+        const std::size_t count = m_elements[e].Size();
+        if (count == 0) continue;
+        const auto own = std::span(forces).subspan(m_firstRow[e], count);
+        (void)m_elements[e].AtNodes(Gather(frame.elements[e], full), PlasticOf(e, state.plastic),
+                                    0.0, tension, own);
+        for (std::size_t l = 0; l < state.factors.size(); ++l)
+            for (std::size_t c = 0; c < count; ++c)
+                own[c] += state.factors[l] * m_loads[l].element[e].force[c];
+    }
+    return {};
+}
+
 CPushStructure::T_FAULT CPushStructure::Displace(std::span<const T_PUSH_STATE> states,
                                                  std::span<T_PUSH_STEP> steps,
                                                  std::vector<double>& tension)
@@ -130,26 +176,14 @@ CPushStructure::T_FAULT CPushStructure::Displace(std::span<const T_PUSH_STATE> s
     constexpr double kRefine = 1e-11; // residual from which a solution is refined
     const std::size_t n = m_dofs.EquationCount();
     std::vector<double> x(n * states.size(), 0.0);
-    for (std::size_t s = 0; s < states.size(); ++s) {
-        double* side = x.data() + s * n;
-        for (std::size_t l = 0; l < states[s].factors.size(); ++l)
-            for (std::size_t i = 0; i < n; ++i)
-                side[i] += states[s].factors[l] * m_loads[l].side[i];
-        for (std::size_t r = 0; r < RowCount(); ++r)
-            if (const double q = states[s].plastic[r]; q != 0.0)
-                for (std::size_t k = m_termFrom[r]; k < m_termFrom[r + 1]; ++k)
-                    side[static_cast<std::size_t>(m_terms[k].index)] += q * m_terms[k].factor;
-    }
+    for (std::size_t s = 0; s < states.size(); ++s)
+        AddSides(states[s], std::span(x).subspan(s * n, n));
     if (auto fault = Solve(x, states.size())) return fault;
     std::vector<double> full(m_dofs.FullCount()), left;
     for (std::size_t s = 0; s < states.size(); ++s) {
         const std::span<double> own(x.data() + s * n, n);
         const auto take = [&] {
-            m_dofs.Expand(own, full);
-            for (std::size_t l = 0; l < states[s].factors.size(); ++l)
-                if (const auto settled = m_loads[l].loads->Settled(); !settled.empty())
-                    for (std::size_t i = 0; i < full.size(); ++i)
-                        full[i] += states[s].factors[l] * settled[i];
+            TakeDisplacements(states[s], own, full);
             Balance(states[s], full, steps[s], left, tension);
         };
         take();

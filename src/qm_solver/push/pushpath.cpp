@@ -24,6 +24,7 @@ CPushPath::CPushPath(const T_PUSH_MODEL& model, CPushStructure& structure)
 {
     m_isCurved = std::any_of(m_flows.flows.begin(), m_flows.flows.end(),
                              [](const CPushFlow& flow) { return flow.HangsOnAxial(); });
+    m_soft.assign(m_flows.flows.size(), 0.0);
     m_lock.resize(m_flows.flows.size());
     for (std::size_t f = 0; f < m_lock.size(); ++f)
         UpdateLock(f);
@@ -93,19 +94,30 @@ CPushPath::T_FAULT CPushPath::Renew()
         for (std::size_t l = 0; l < m_structure.LoadCount(); ++l)
             w.byLoads.push_back(m_structure.Value(w.probe, m_structure.Loads(l).unknowns));
     }
-    std::vector<char> wanted(m_structure.RowCount());
-    for (std::size_t r = 0; r < wanted.size(); ++r)
-        wanted[r] = m_plastic[r] != 0.0;
+    if (auto fault = Rebase()) return fault;
+    std::vector<std::size_t> rows;
     for (const std::size_t f : m_active)
         for (const T_FLOW_TERM& d : m_flows.flows[f].Direction(m_force, Resistance(f)))
-            wanted[d.row] = 1;
-    std::vector<std::size_t> rows;
-    for (std::size_t r = 0; r < wanted.size(); ++r)
-        if (wanted[r]) rows.push_back(r);
+            rows.push_back(d.row);
+    std::sort(rows.begin(), rows.end());
+    rows.erase(std::unique(rows.begin(), rows.end()), rows.end());
     if (!rows.empty())
         if (auto fault = Fetch(rows)) return fault;
-    SumUp();
     return Rebuild();
+}
+
+/// Forces and displacements of the state from the structure; what follows is added to them.
+CPushPath::T_FAULT CPushPath::Rebase()
+{
+    std::vector<double> unknowns;
+    m_base.factors = m_factors;
+    m_base.plastic = m_plastic;
+    if (auto fault = m_structure.Solve(State(), unknowns, m_base.force)) return fault;
+    m_base.watch.clear();
+    for (const T_WATCH& w : m_watches)
+        m_base.watch.push_back(m_structure.Value(w.probe, unknowns));
+    SumUp();
+    return {};
 }
 
 CPushPath::T_FAULT CPushPath::Rebuild()
@@ -123,20 +135,25 @@ CPushPath::T_FAULT CPushPath::Rebuild()
 
 void CPushPath::SumUp()
 {
-    std::fill(m_force.begin(), m_force.end(), 0.0);
-    for (T_WATCH& w : m_watches)
-        w.value = 0.0;
+    m_force = m_base.force;
+    for (std::size_t w = 0; w < m_watches.size(); ++w)
+        m_watches[w].value = m_base.watch[w];
     for (std::size_t l = 0; l < m_factors.size(); ++l) {
+        const double more = m_factors[l] - m_base.factors[l];
+        if (more == 0.0) continue;
         const std::vector<double>& loads = m_structure.Loads(l).force;
         for (std::size_t r = 0; r < m_force.size(); ++r)
-            m_force[r] += m_factors[l] * loads[r];
+            m_force[r] += more * loads[r];
         for (T_WATCH& w : m_watches)
-            w.value += m_factors[l] * w.byLoads[l];
+            w.value += more * w.byLoads[l];
     }
-    AddColumns(m_plastic, m_force);
-    for (std::size_t c = 0; c < m_plastic.size(); ++c)
-        for (std::size_t w = 0; w < m_watches.size() && m_plastic[c] != 0.0; ++w)
-            m_watches[w].value += m_plastic[c] * m_columnOf[c]->watch[w];
+    std::vector<double> more(m_plastic);
+    for (std::size_t r = 0; r < more.size(); ++r)
+        more[r] -= m_base.plastic[r];
+    AddColumns(more, m_force);
+    for (std::size_t c = 0; c < more.size(); ++c)
+        for (std::size_t w = 0; w < m_watches.size() && more[c] != 0.0; ++w)
+            m_watches[w].value += more[c] * m_columnOf[c]->watch[w];
     m_sinceSum = 0;
 }
 
@@ -166,8 +183,8 @@ double CPushPath::NextEvent(double back) const
         }
         const CPushFlow& flow = m_flows.flows[f];
         const CHingeBackbone& backbone = Backbone(f);
-        const bool flows = IsActive(f);
-        const double rate = flows ? m_rate.flow[m_place[f] - 1] : PhiRate(f);
+        const bool flows = IsMoving(f);
+        const double rate = flows ? FlowRate(f) : PhiRate(f);
         const double size = rate * (flows ? flow.stiffness : 1.0) / flow.force;
         if (flows && size > least) take(backbone.Room(true), rate);
         if (flows && size < -least && backbone.On() == ON::Back) take(backbone.Room(false), -rate);
@@ -193,8 +210,7 @@ void CPushPath::Advance(double by)
         m_force[r] += by * m_rate.force[r];
     for (std::size_t r = 0; r < m_plastic.size(); ++r)
         m_plastic[r] += by * m_rate.plastic[r];
-    for (std::size_t k = 0; k < m_active.size(); ++k)
-        Backbone(m_active[k]).Flow(by * m_rate.flow[k]);
+    MoveFlows(m_rate.flow, m_rate.force, by);
     for (T_WATCH& w : m_watches)
         w.value += by * w.rate;
 }
@@ -212,8 +228,8 @@ long CPushPath::Turn()
         }
         CHingeBackbone& backbone = Backbone(f);
         const double near = kNear * flow.force, close = near / flow.stiffness;
-        const bool flows = IsActive(f);
-        const double rate = flows ? m_rate.flow[m_place[f] - 1] * flow.stiffness : PhiRate(f);
+        const bool flows = IsMoving(f);
+        const double rate = flows ? FlowRate(f) * flow.stiffness : PhiRate(f);
         const double size = rate / flow.force;
         const auto turn = [&](auto&& change) {
             Touch(f);
@@ -302,6 +318,7 @@ CPushPath::T_FAULT CPushPath::Correct(std::optional<double> control)
         }
         for (std::size_t k = 0; k < m_active.size(); ++k) {
             const std::size_t f = m_active[k];
+            if (!IsMoving(f)) continue; // a folded one that is locked
             right[k + 1] = Phi(f, Resistance(f));
             worst = std::max(worst, std::fabs(right[k + 1]) / m_flows.flows[f].force);
         }
@@ -315,8 +332,12 @@ CPushPath::T_FAULT CPushPath::Correct(std::optional<double> control)
             const std::size_t f = m_active[k];
             for (const T_FLOW_TERM& d : m_flows.flows[f].Direction(m_force, Resistance(f)))
                 m_plastic[d.row] += d.factor * x[k + 1];
-            Backbone(f).Flow(x[k + 1]);
         }
+        std::vector<double> change = m_force;
+        SumUp();
+        for (std::size_t r = 0; r < change.size(); ++r)
+            change[r] = m_force[r] - change[r];
+        MoveFlows(std::span(x).subspan(1), change, 1.0);
     }
     SumUp();
     return {};
@@ -325,11 +346,9 @@ CPushPath::T_FAULT CPushPath::Correct(std::optional<double> control)
 double CPushPath::Deformation(std::size_t hinge, std::size_t law, double& rate) const
 {
     const std::size_t row = m_structure.RowOf(hinge, law);
-    const double spring = m_model.hinges[hinge].laws[law].stiffness;
-    rate = m_rate.plastic.empty()
-               ? 0.0
-               : m_rate.plastic[row] + (spring > 0.0 ? m_rate.force[row] / spring : 0.0);
-    return m_plastic[row] + (spring > 0.0 ? m_force[row] / spring : 0.0);
+    const double compliance = m_structure.Compliance(row);
+    rate = m_rate.plastic.empty() ? 0.0 : m_rate.plastic[row] + compliance * m_rate.force[row];
+    return m_plastic[row] + compliance * m_force[row];
 }
 
 std::vector<T_HINGE_STATE> CPushPath::HingeStates() const

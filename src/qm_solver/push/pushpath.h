@@ -55,6 +55,11 @@ public:
     T_FAULT BeginStage(std::size_t set, std::optional<std::size_t> control);
     /// Answers of the structure anew, after another factorisation; the state stays.
     T_FAULT Renew();
+    /// So many flows are active that a factorisation with what has yielded pays.
+    bool WantsFold() const;
+    /// Takes the flows that harden into the elastic structure, as springs in series: they need no
+    /// column and no row of the small system any more, until they turn. Selects must follow.
+    T_FAULT Fold();
 
     /// Finds who flows next and the rates. 1 done; 0 there is no way on.
     enum class WAY { On, None, Fault };
@@ -79,7 +84,10 @@ public:
     double Factor() const { return m_factors.back(); }
     const std::vector<double>& Factors() const { return m_factors; }
     const std::vector<double>& Plastic() const { return m_plastic; }
+    /// As the structure is now, softer where flows are folded.
     T_PUSH_STATE State() const { return {m_factors, m_plastic}; }
+    /// As the structure was given.
+    T_PUSH_STATE WholeState() const;
     std::vector<T_HINGE_STATE> HingeStates() const;
     /// Plastic and elastic part of the deformation of a law, and its rate.
     double Deformation(std::size_t hinge, std::size_t law, double& rate) const;
@@ -129,7 +137,18 @@ private:
     }
     // pushpath.cpp
     T_FAULT Rebuild();
+    T_FAULT Rebase();
     void SumUp();
+    bool IsMoving(std::size_t flow) const;
+    bool IsFoldable(std::size_t flow) const;
+    /// The flow is told by its row's spring alone.
+    bool IsFolded(std::size_t flow) const;
+    bool BelongsInSystem(std::size_t flow) const;
+    double FlowRate(std::size_t flow) const;
+    /// Condition of an active flow: alpha rate of its force = beta rate of its unknown.
+    double Alpha(std::size_t flow) const;
+    double Beta(std::size_t flow) const;
+    void MoveFlows(std::span<const double> unknowns, std::span<const double> forces, double by);
     void TakeDrive(std::span<const std::size_t> begun);
     double Least() const { return kLeastRate * m_norm; }
     void MakeRowScales();
@@ -151,8 +170,14 @@ private:
     std::map<std::size_t, T_COLUMN> m_columns;
     std::vector<const T_COLUMN*> m_columnOf; // by row
     std::vector<T_WATCH> m_watches;
-    std::vector<double> m_factors; // by set of loads
-    std::vector<double> m_force, m_plastic;
+    std::vector<double> m_factors;          // by set of loads
+    std::vector<double> m_force, m_plastic; // plastic: beyond the springs of the structure
+    std::vector<double> m_soft;             // by flow: compliance that the structure holds for it
+    std::vector<std::size_t> m_softFlows;   // those that have some
+    struct T_BASE { // from displacements; what has changed since is summed up
+        std::vector<double> factors, plastic, force, watch;
+    };
+    T_BASE m_base;
     std::optional<std::size_t> m_control;
     /// What decides about a flow that is locked and hangs on the force of one row alone.
     struct T_LOCK {

@@ -106,9 +106,8 @@ double CPushPath::DriveSign() const
         break;
     case KIND::Flows:
         for (const std::size_t f : m_drive.flows)
-            if (IsActive(f))
-                sum += m_rate.flow[m_place[f] - 1] * m_flows.flows[f].stiffness /
-                       m_flows.flows[f].force;
+            if (IsMoving(f))
+                sum += FlowRate(f) * m_flows.flows[f].stiffness / m_flows.flows[f].force;
         if (std::fabs(sum) > least) return sum > 0.0 ? 1.0 : -1.0;
         sum = 0.0;
         break;
@@ -123,11 +122,14 @@ double CPushPath::DriveSign() const
     }
     if (sum != 0.0) return sum > 0.0 ? 1.0 : -1.0;
     // As before: what flows on the backbone goes on, else the forces do.
-    for (std::size_t k = 0; k < m_active.size(); ++k) {
-        const CPushFlow& flow = m_flows.flows[m_active[k]];
-        if (m_flows.backbones[flow.backbone].On() == ON::Virgin)
-            sum += m_rate.flow[k] * flow.stiffness / flow.force;
-    }
+    const auto add = [&](std::size_t f) {
+        if (Backbone(f).On() == ON::Virgin)
+            sum += FlowRate(f) * m_flows.flows[f].stiffness / m_flows.flows[f].force;
+    };
+    for (const std::size_t f : m_active)
+        add(f);
+    for (const std::size_t f : m_softFlows)
+        if (!IsActive(f)) add(f);
     if (std::fabs(sum) > least) return sum > 0.0 ? 1.0 : -1.0;
     if (m_before.empty()) return m_rate.control >= 0.0 ? 1.0 : -1.0;
     sum = 0.0;

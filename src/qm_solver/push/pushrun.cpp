@@ -45,6 +45,7 @@ CPushRun::T_FAULT CPushRun::Go(std::span<const T_PUSH_STAGE> stages, T_PUSH_END&
     end = {};
     bool goesOn = true;
     m_structure.DropLoads();
+    m_structure.Stiffen();
     if (auto fault = Initial(end, goesOn)) return fault;
     for (std::size_t s = 0; s < stages.size() && goesOn; ++s)
         if (auto fault = Stage(stages[s], s, end, goesOn)) return fault;
@@ -202,6 +203,7 @@ CPushRun::T_FAULT CPushRun::Store(const T_PUSH_STAGE& stage, int number, bool ad
     step.additional = additional;
     step.hinges = m_path->HingeStates();
     m_states.push_back(m_path->State());
+    m_wholeStates.push_back(m_path->WholeState());
     end.loadFactor = step.loadFactor;
     end.displacement = step.displacement;
     return m_steps.size() >= kStepBlock || IsUpdated() ? Flush(end) : T_FAULT{};
@@ -234,6 +236,7 @@ CPushRun::T_FAULT CPushRun::Flush(T_PUSH_END& end)
     }
     m_steps.clear();
     m_states.clear();
+    m_wholeStates.clear();
     return {};
 }
 
@@ -260,6 +263,12 @@ CPushRun::T_FAULT CPushRun::Follow(const T_PUSH_STAGE& stage, int number, T_PUSH
         const CPushPath::WAY found = m_path->Select(fault);
         if (found == CPushPath::WAY::Fault) return fault;
         NoteEvent(stage, number);
+        if (found == CPushPath::WAY::On && m_path->WantsFold()) {
+            if ((fault = Flush(end)) || (fault = m_path->Fold())) return fault;
+            if (m_cancelled) return finish(end.outcome);
+            m_path->SetDrive({T_PUSH_DRIVE::KIND::Before, 1.0, {}});
+            continue;
+        }
         if (found == CPushPath::WAY::None || (byLoad && !m_path->LoadGrows(kMechanism)))
             return finish(byLoad ? PUSH_OUTCOME::NoEquilibrium : PUSH_OUTCOME::NoPath);
         if (number >= 0 && StopsHere(stage, end)) {

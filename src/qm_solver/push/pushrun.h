@@ -57,9 +57,9 @@ private:
     double m_origin = 0.0; // control displacement before the first stage
     bool m_isFirst = true;
     T_PEAK m_peak;
-    std::vector<T_PUSH_EVENT> m_events; // of the initial loads, until they are final
-    std::vector<T_PUSH_STEP> m_steps;   // waiting for their displacements
-    std::vector<T_PUSH_STATE> m_states;
+    std::vector<T_PUSH_EVENT> m_events;                // of the initial loads, until they are final
+    std::vector<T_PUSH_STEP> m_steps;                  // waiting for their displacements
+    std::vector<T_PUSH_STATE> m_states, m_wholeStates; // of the structure as it is, as it was given
     struct T_KEPT {
         std::size_t stage;
         double loadFactor, displacement;

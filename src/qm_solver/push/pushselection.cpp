@@ -15,11 +15,6 @@ constexpr std::size_t kBlock = 16; // columns solved together
 
 using ON = CHingeBackbone::ON;
 
-bool IsMoving(ON on)
-{
-    return on == ON::Virgin || on == ON::Back;
-}
-
 } // namespace
 
 double CPushPath::Tolerance(std::size_t flow) const
@@ -105,26 +100,27 @@ CPushPath::T_FAULT CPushPath::Activate(std::size_t f)
     const auto direction = flow.Direction(m_force, resistance);
     const std::vector<double>& loads = m_structure.Loads(m_factors.size() - 1).force;
     std::vector<double> row(m_system.Size()), column(m_system.Size());
+    const double alpha = Alpha(f);
     for (const T_FLOW_TERM& g : gradient)
-        row[0] -= g.factor * loads[g.row];
+        row[0] -= alpha * g.factor * loads[g.row];
     if (m_border == 0 && m_control)
         for (const T_FLOW_TERM& d : direction)
             column[0] += d.factor * m_columnOf[d.row]->watch[*m_control];
     if (m_border == 2) column[0] = flow.force;
     for (std::size_t k = 0; k < m_active.size(); ++k) {
         CPushFlow& other = m_flows.flows[m_active[k]];
-        const double theirs = Resistance(m_active[k]);
+        const double theirs = Resistance(m_active[k]), theirAlpha = Alpha(m_active[k]);
         for (const T_FLOW_TERM& g : gradient)
             for (const T_FLOW_TERM& d : other.Direction(m_force, theirs))
-                row[k + 1] -= g.factor * d.factor * m_columnOf[d.row]->force[g.row];
+                row[k + 1] -= alpha * g.factor * d.factor * m_columnOf[d.row]->force[g.row];
         for (const T_FLOW_TERM& g : other.Gradient(m_force, theirs))
             for (const T_FLOW_TERM& d : direction)
-                column[k + 1] -= g.factor * d.factor * m_columnOf[d.row]->force[g.row];
+                column[k + 1] -= theirAlpha * g.factor * d.factor * m_columnOf[d.row]->force[g.row];
     }
-    double diagonal = flow.Scale(m_force) * backbone.Slope();
+    double diagonal = Beta(f);
     for (const T_FLOW_TERM& g : gradient)
         for (const T_FLOW_TERM& d : direction)
-            diagonal -= g.factor * d.factor * m_columnOf[d.row]->force[g.row];
+            diagonal -= alpha * g.factor * d.factor * m_columnOf[d.row]->force[g.row];
     m_system.Add(row, column, diagonal);
     m_active.push_back(f);
     m_place[f] = m_active.size();
@@ -146,7 +142,7 @@ CPushPath::T_FAULT CPushPath::Sync(std::size_t f)
 {
     UpdateLock(f);
     if (IsActive(f)) Deactivate(f);
-    if (!IsMoving(m_flows.backbones[m_flows.flows[f].backbone].On())) return {};
+    if (!BelongsInSystem(f)) return {};
     return Activate(f);
 }
 
@@ -166,12 +162,12 @@ std::vector<CPushPath::T_CHANGE> CPushPath::Violations()
         if (flow.HangsOnAxial()) {
             const double slope = flow.Lines()[0].Slope(), other = flow.Lines()[1].Slope();
             ChoosePart(f);
-            if (IsActive(f) &&
+            if (IsMoving(f) &&
                 (slope != flow.Lines()[0].Slope() || other != flow.Lines()[1].Slope()))
                 out.push_back({f, 0.0, KIND::Part});
         }
-        if (IsActive(f)) {
-            const double rate = m_rate.flow[m_place[f] - 1] * flow.stiffness / flow.force;
+        if (IsMoving(f)) {
+            const double rate = FlowRate(f) * flow.stiffness / flow.force;
             const double end = kAtLimit * flow.force / flow.stiffness;
             if (backbone.On() == ON::Virgin && rate < -least)
                 out.push_back({f, -rate, KIND::Unload});

@@ -66,7 +66,9 @@ void CPushStructure::MakeRows()
             m_rowsOf[e].push_back(m_rows.size());
             m_rows.push_back({e, c});
         }
-        m_elements.emplace_back(frame, e, std::move(placed[e]));
+        for (const T_PLACED_COMPONENT& c : placed[e])
+            m_spring.push_back(c.spring > 0.0 ? 1.0 / c.spring : 0.0);
+        m_elements.emplace_back(frame, e, placed[e]);
     }
     for (std::size_t h = 0; h < m_model.hinges.size(); ++h) {
         auto& rows = m_lawRow.emplace_back();
@@ -75,6 +77,17 @@ void CPushStructure::MakeRows()
         m_axialRow.push_back(axial[h] ? m_rowsOf[m_model.hinges[h].element][*axial[h]]
                                       : m_rows.size());
     }
+    m_placed = std::move(placed);
+    m_soft.assign(m_rows.size(), 0.0);
+    MakeTerms();
+}
+
+/// Influence of the rows over the unknowns.
+void CPushStructure::MakeTerms()
+{
+    const T_FRAME& frame = m_model.frame;
+    m_terms.clear();
+    m_termFrom.clear();
     m_termFrom.push_back(0);
     for (const T_PUSH_ROW& row : m_rows) {
         const T_ELEMENT& element = frame.elements[row.element];
@@ -120,7 +133,7 @@ CPushStructure::T_FAULT CPushStructure::Prepare()
 
 CPushStructure::T_FAULT CPushStructure::Factorise(std::vector<double> tension)
 {
-    if (tension.empty() && m_tension.empty()) return {};
+    if (tension.empty() && m_tension.empty() && !m_isSoft) return {};
     m_tension = std::move(tension);
     return Refactorise();
 }
@@ -133,9 +146,46 @@ CPushStructure::T_FAULT CPushStructure::Refactorise()
     });
     T_SOLVER_REASON reason;
     if (!m_factor.Factor(m_assembly.Matrix(), reason, PIVOTS::AsTheyAre)) return Failed(reason);
+    m_isSoft = false;
     ++m_cost.factorisations;
     if (m_factor.Info().negativePivots > 0) return Failed("IDS_QM_ENGINE_PUSH_BUCKLES");
     return {};
+}
+
+void CPushStructure::MakeElement(std::size_t element)
+{
+    std::vector<T_PLACED_COMPONENT> components = m_placed[element];
+    for (std::size_t c = 0; c < components.size(); ++c) {
+        const double compliance = Compliance(m_firstRow[element] + c);
+        components[c].spring = compliance > 0.0 ? 1.0 / compliance : 0.0;
+    }
+    m_elements[element] = CPushElement(m_model.frame, element, std::move(components));
+}
+
+CPushStructure::T_FAULT CPushStructure::Soften(std::span<const double> compliance)
+{
+    const std::vector<double> before(m_soft);
+    m_soft.assign(compliance.begin(), compliance.end());
+    for (std::size_t r = 0; r < m_rows.size(); ++r)
+        if (m_soft[r] != before[r]) MakeElement(m_rows[r].element);
+    MakeTerms();
+    for (T_PUSH_LOADS& set : m_loads)
+        FillLoads(set);
+    return Refactorise();
+}
+
+void CPushStructure::Stiffen()
+{
+    for (std::size_t r = 0; r < m_rows.size(); ++r) {
+        if (m_soft[r] == 0.0) continue;
+        m_soft[r] = 0.0;
+        MakeElement(m_rows[r].element);
+        m_isSoft = true;
+    }
+    if (!m_isSoft) return;
+    MakeTerms();
+    for (T_PUSH_LOADS& set : m_loads)
+        FillLoads(set);
 }
 
 CPushStructure::T_FAULT CPushStructure::Solve(std::span<double> sides, std::size_t count)
@@ -149,9 +199,18 @@ CPushStructure::T_FAULT CPushStructure::Solve(std::span<double> sides, std::size
 CPushStructure::T_FAULT CPushStructure::AddLoads(const T_LOAD_CASE& given, std::size_t number)
 {
     if (auto fault = CheckCase(m_model.frame, m_dofs, given, number)) return fault;
-    const T_FRAME& frame = m_model.frame;
     T_PUSH_LOADS& set = m_loads.emplace_back();
-    set.loads = std::make_unique<CCaseLoads>(frame, m_dofs, given);
+    set.loads = std::make_unique<CCaseLoads>(m_model.frame, m_dofs, given);
+    FillLoads(set);
+    return {};
+}
+
+/// What the loads do to the elements as they are now.
+void CPushStructure::FillLoads(T_PUSH_LOADS& set) const
+{
+    const T_FRAME& frame = m_model.frame;
+    set.sum = {};
+    set.element.clear();
     std::vector<double> full(set.loads->Nodal().begin(), set.loads->Nodal().end());
     const auto addSum = [&](std::size_t index, double force) {
         T_VEC3 f{};
@@ -191,7 +250,6 @@ CPushStructure::T_FAULT CPushStructure::AddLoads(const T_LOAD_CASE& given, std::
     }
     set.side.assign(m_dofs.EquationCount(), 0.0);
     m_dofs.Reduce(full, set.side);
-    return {};
 }
 
 CPushStructure::T_FAULT CPushStructure::SolveLoads()

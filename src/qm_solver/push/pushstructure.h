@@ -54,6 +54,13 @@ public:
     std::span<const double> Tension() const { return m_tension; }
     /// Checks and takes a set of loads, the next one; `number` names it in a fault.
     T_FAULT AddLoads(const T_LOAD_CASE& loads, std::size_t number);
+    /// Compliance in series with rows, beyond their own springs: elements, loads and factor anew.
+    /// Answers to loads and plastic deformations are to be asked for again.
+    T_FAULT Soften(std::span<const double> compliance);
+    /// The elements as they were given, without a factor.
+    void Stiffen();
+    /// Of all that is elastic in series with the element.
+    double Compliance(std::size_t row) const { return m_spring[row] + m_soft[row]; }
     void DropLoads()
     {
         m_loads.clear();
@@ -87,6 +94,9 @@ public:
     /// tension: mean axial forces of the elements in the last one.
     T_FAULT Displace(std::span<const T_PUSH_STATE> states, std::span<T_PUSH_STEP> steps,
                      std::vector<double>& tension);
+    /// Unknowns and forces of all rows of a state, from its displacements.
+    T_FAULT Solve(const T_PUSH_STATE& state, std::vector<double>& unknowns,
+                  std::vector<double>& forces);
     /// Forces inside all elements of a displaced state.
     void Inside(const T_PUSH_STATE& state, const T_PUSH_STEP& step, T_RESULT& out) const;
     /// Axial forces that P-Delta acts on: 0 of what is level.
@@ -102,6 +112,12 @@ public:
 private:
     void MakeRows();
     void MakeForceScale();
+    void MakeTerms();
+    void MakeElement(std::size_t element);
+    void FillLoads(T_PUSH_LOADS& set) const;
+    void AddSides(const T_PUSH_STATE& state, std::span<double> side) const;
+    void TakeDisplacements(const T_PUSH_STATE& state, std::span<const double> unknowns,
+                           std::span<double> full) const;
     T_FAULT Solve(std::span<double> sides, std::size_t count);
     std::span<const double> PlasticOf(std::size_t element, std::span<const double> plastic) const;
     T_VEC12 ElementLoads(std::size_t element, std::span<const double> factors) const;
@@ -114,12 +130,15 @@ private:
     CSparseFactor m_factor;
     double m_extent = 1.0;
     std::vector<CPushElement> m_elements;
+    std::vector<std::vector<T_PLACED_COMPONENT>> m_placed; // of the elements, as given
+    std::vector<double> m_spring, m_soft; // by row: compliance of its spring, and in series with it
     std::vector<T_PUSH_ROW> m_rows;
     std::vector<std::vector<std::size_t>> m_lawRow, m_rowsOf; // by hinge; by element
     std::vector<std::size_t> m_axialRow, m_firstRow;          // by hinge; by element
     std::vector<std::size_t> m_termFrom; // influence of the rows over the unknowns
     std::vector<T_TERM> m_terms;
     std::vector<double> m_tension; // of the factor; empty: first order
+    bool m_isSoft = false;         // the factor is that of softer elements
     std::vector<T_PUSH_LOADS> m_loads;
     double m_largest = 0.0; // force of the run so far, what residuals are compared with
     double m_least = 0.0;   // a part of the strengths, below which it does not fall
