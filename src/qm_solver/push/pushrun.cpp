@@ -44,6 +44,8 @@ CPushRun::T_FAULT CPushRun::Go(std::span<const T_PUSH_STAGE> stages, T_PUSH_END&
 {
     end = {};
     bool goesOn = true;
+    if (!stages.empty())
+        m_follows = {stages[0].node, static_cast<std::size_t>(stages[0].direction)};
     m_structure.DropLoads();
     m_structure.Stiffen();
     if (auto fault = Initial(end, goesOn)) return fault;
@@ -90,6 +92,7 @@ CPushRun::T_FAULT CPushRun::InitialPath(T_PUSH_END& end, bool& goesOn)
     m_nodeWatch.clear();
     m_driftWatch.clear();
     const T_PUSH_STAGE stage = InitialStage(m_model);
+    m_nodeWatch.push_back(m_path->Watch(m_structure.Displacement(m_follows[0], m_follows[1])));
     if (auto fault = m_path->BeginStage(0, std::nullopt)) return fault;
     MakeTargets(stage);
     if (auto fault = Follow(stage, -1, end)) return fault;

@@ -49,7 +49,8 @@ private:
     CPushStructure& m_structure;
     const T_PUSH_SINK& m_sink;
     std::unique_ptr<CPushPath> m_path;
-    std::vector<std::size_t> m_nodeWatch; // translations in the direction of control
+    std::array<std::size_t, 2> m_follows{}; // node and direction that the initial loads are told by
+    std::vector<std::size_t> m_nodeWatch;   // translations in the direction of control
     std::vector<std::array<std::size_t, 2>> m_driftWatch;
     std::vector<T_TARGET> m_targets;
     std::size_t m_target = 0;

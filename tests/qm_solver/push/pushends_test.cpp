@@ -57,7 +57,7 @@ std::vector<T_END_CASE> EndCases()
         .stage.stops.strengthLoss = true;
     add("last point", soft, PUSH_OUTCOME::LastPointStop, 25.0, 25.0 * 8.0 / 300.0 + 1.0)
         .stage.stops.lastPoint = true;
-    T_END_CASE& initial = add("initial loads", ideal, PUSH_OUTCOME::InitialLoads, 0.625, 0.0);
+    T_END_CASE& initial = add("initial loads", ideal, PUSH_OUTCOME::InitialLoads, 0.625, 4.0 / 3.0);
     initial.model.initial = PushTo(1.0).loads;
     initial.model.initial.nodal[0].load[0] = 80.0;
     // 100 at no axial force, 0 at a tension of 60; drawn by 10 for each 1 across: 2 P stays below
