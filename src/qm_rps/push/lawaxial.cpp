@@ -117,11 +117,14 @@ int FromSurface(const T_AXIAL_BASIS& b, std::vector<solver::T_AXIAL_STRENGTH>& o
     if (!b.type.yieldSurface) return FromSection(b, out, reason);
     const T_YIELD_LEVEL& level = b.type.yieldSurface->yield;
     const T_YIELD_AXIS& axis = b.component == HINGE_COMPONENT::My ? level.y : level.z;
-    if (!axis.used || !(level.compression > 0.0)) {
+    T_SIDES<double> largest = axis.momentMax;
+    if (!axis.used || !(level.compression > 0.0) || !(largest.pos > 0.0) || !(largest.neg > 0.0)) {
         reason = Say("IDS_QM_PUSH_LAW_NO_PM");
         return 0;
     }
-    return FromShape(b, SectionLines(b.component, axis.curves, level.compression), out, reason);
+    if (IsSectionSignOpposite(b.component)) std::swap(largest.pos, largest.neg);
+    Join(SectionLines(b.component, axis.curves, level.compression), largest, out);
+    return 1;
 }
 
 int FromUser(const T_AXIAL_BASIS& b, std::vector<solver::T_AXIAL_STRENGTH>& out,
@@ -134,8 +137,11 @@ int FromUser(const T_AXIAL_BASIS& b, std::vector<solver::T_AXIAL_STRENGTH>& out,
     }
     const std::size_t axis = b.component == HINGE_COMPONENT::My ? 0 : 1;
     const T_PMM_CURVES& negative = pmm->negative ? *pmm->negative : pmm->curves;
-    return FromShape(b, {LineOf(pmm->curves[axis], pmm->Pmax), LineOf(negative[axis], pmm->Pmax)},
-                     out, reason);
+    const T_SIDES<T_LINE> lines{LineOf(pmm->curves[axis], pmm->Pmax),
+                                LineOf(negative[axis], pmm->Pmax)};
+    if (IsAutoYield(b.curve)) return FromShape(b, lines, out, reason);
+    Join(lines, b.yield, out);
+    return 1;
 }
 
 /// Entered strengths of curves by axial force (compression positive).

@@ -26,9 +26,10 @@ struct T_AXIAL_BASIS {
 
 /// Yield strengths by axial force, tension positive, ascending; empty: the axial force does not
 /// count. Curves by axial force: their entered strengths, beyond the list those of its ends. Else
-/// by the interaction of the component: PMM the yield surface of the type, where it has none the
-/// section and material of the element; user the type's P-M curves. These give the shape alone: the
-/// strength at no axial force is the yield strength. Automatic strengths of curves by axial force
+/// by the interaction of the component. PMM: the moments of the type's yield surface; where it has
+/// none, section and material of the element give the shape, and the yield strength is that at no
+/// axial force. User: M / Mmax of the type's curves times the entered yield strength, which is
+/// Mmax; an automatic one is that at no axial force. Curves by axial force with automatic strengths
 /// follow section and material.
 /// 1 done; 0 with the reason: there is no curve, or it does not reach a force of 0.
 [[nodiscard]] int StrengthsByAxial(const T_AXIAL_BASIS& basis,

@@ -4,6 +4,8 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+
 namespace {
 
 /// One member of 3 m in N and m: E I = 4e6 about both axes, so 6EI/L = 8e6.
@@ -111,35 +113,47 @@ TEST(PushLaws, AutomaticStrengthsComeFromTheGeneratedHinge)
     EXPECT_NE(std::string::npos, error.find("--type \"T\" --elements 1")) << error;
 }
 
-// Pmax 1000: half of the moment at 500 of compression and at 250 of tension; (-) falls to nothing
-// at 250 of compression. The strength at no axial force is that of the curve.
-TEST(PushLaws, UserCurvesGiveStrengthsByAxialForce)
+// Pmax 1000; the entered strengths are Mmax of the two sides. (+) is half of its largest at 500 of
+// compression and at 250 of tension; (-) falls to nothing at 250 of compression.
+TEST(PushLaws, InteractionGivesStrengthsByAxialForce)
 {
-    T_PHGT_D type = Type({Mz}, Flat(300, 200));
+    T_PHGT_D type = Type({My}, Flat(300, 200));
     type.interaction = HINGE_INTERACTION::User;
     T_PMM_TABLE& t = type.pmm.emplace();
     t.Pmax = 1000;
     t.negative.emplace();
-    auto &pos = t.curves[1], &neg = (*t.negative)[1];
-    pos.fill({-0.5, 0}), neg.fill({-0.5, 0.5});
-    pos[0] = {1, 0}, pos[1] = {0.5, 0.4}, pos[2] = {0, 0.8}, pos[3] = {-0.25, 0.4};
-    neg[0] = {1, 0}, neg[1] = {0.25, 0}, neg[2] = {0, 0.5};
-    std::string error;
-    const T_PUSH_HINGES h = Build(type, {Hinge()}, error);
-    ASSERT_EQ(2u, h.hinges.size()) << error;
-    const auto& rows = h.hinges[0].laws[0].byAxial;
+    auto &pos = t.curves[0], &neg = (*t.negative)[0];
+    pos.fill({-0.5, 0}), neg.fill({-0.5, 1});
+    pos[0] = {1, 0}, pos[1] = {0.5, 0.5}, pos[2] = {0, 1}, pos[3] = {-0.25, 0.5};
+    neg[0] = {1, 0}, neg[1] = {0.25, 0}, neg[2] = {0, 1};
     const double expected[][3] = {{-1000, 0, 0}, {-500, 150, 0},  {-250, 225, 0},
                                   {0, 300, 200}, {250, 150, 200}, {500, 0, 200}};
-    ASSERT_EQ(6u, rows.size());
-    for (std::size_t i = 0; i < rows.size(); ++i) {
-        EXPECT_NEAR(expected[i][0], rows[i].axial, 1e-9) << i;
-        EXPECT_NEAR(expected[i][1], rows[i].positive, 1e-9) << i;
-        EXPECT_NEAR(expected[i][2], rows[i].negative, 1e-9) << i;
-    }
-    T_PHGT_D none = type;
-    none.pmm->curves[1].fill({0.5, 0.5});
-    EXPECT_TRUE(Build(none, {Hinge()}, error).hinges.empty());
-    EXPECT_NE(std::string::npos, error.find("interaction curve of the side (+)")) << error;
+    const auto check = [&](const T_PHGT_D& of, bool mirrored) {
+        std::string error;
+        const T_PUSH_HINGES h = Build(of, {Hinge()}, error);
+        ASSERT_EQ(2u, h.hinges.size()) << error;
+        const auto& rows = h.hinges[0].laws[0].byAxial;
+        ASSERT_EQ(6u, rows.size());
+        for (std::size_t i = 0; i < rows.size(); ++i) {
+            EXPECT_NEAR(expected[i][0], rows[i].axial, 1e-9) << i;
+            EXPECT_NEAR(expected[i][mirrored ? 2 : 1], rows[i].positive, 1e-9) << i;
+            EXPECT_NEAR(expected[i][mirrored ? 1 : 2], rows[i].negative, 1e-9) << i;
+        }
+    };
+    check(type, false);
+    // The same as a yield surface, whose My (+) compresses +z: it is what an analysis calls (-).
+    T_PHGT_D surface = type;
+    surface.interaction = HINGE_INTERACTION::PMM;
+    T_YIELD_LEVEL& level = surface.yieldSurface.emplace().yield;
+    level.compression = 1000;
+    level.y.momentMax = {300, 200};
+    std::copy_n(pos.begin(), 10, level.y.curves.pos.begin());
+    std::copy_n(neg.begin(), 10, level.y.curves.neg.begin());
+    check(surface, true);
+    type.pmm.reset();
+    std::string error;
+    EXPECT_TRUE(Build(type, {Hinge()}, error).hinges.empty());
+    EXPECT_NE(std::string::npos, error.find("there is no interaction curve")) << error;
 }
 
 TEST(PushLaws, RefuseWhatDoesNotFitNamingElementTypeAndComponent)
