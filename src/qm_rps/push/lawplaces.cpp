@@ -26,12 +26,13 @@ T_LEGENDRE Legendre(int n, double x)
 }
 
 /// Points of the locations of a beam.
-std::vector<T_HINGE_SPOT> Ends(const T_HINGE_COMPONENT& c, HINGE_COMPONENT component)
+std::vector<T_HINGE_SPOT> Ends(const T_HINGE_COMPONENT& c, HINGE_COMPONENT component, bool isLoaded)
 {
     const T_HINGE_SPOT i{0.0, "I"}, center{0.5, "C"};
     T_HINGE_SPOT j{1.0, "J"};
     j.pageJ = !c.sameEnds;
-    const bool alike = component == HINGE_COMPONENT::Fx || component == HINGE_COMPONENT::Mx;
+    const bool shear = component == HINGE_COMPONENT::Fy || component == HINGE_COMPONENT::Fz;
+    const bool alike = !IsBending(component) && (!shear || !isLoaded);
     switch (c.location) {
     case HINGE_LOCATION::IEnd:
         return {i};
@@ -83,27 +84,27 @@ std::vector<T_LOBATTO_POINT> LobattoPoints(int n)
     return points;
 }
 
-int HingeSpots(const T_PHGT_D& type, HINGE_COMPONENT component, ELEM_KIND kind,
-               double elementLength, double memberLength, std::vector<T_HINGE_SPOT>& out,
-               std::string& reason)
+int HingeSpots(const T_PHGT_D& type, HINGE_COMPONENT component, const T_HINGE_SPAN& span,
+               std::vector<T_HINGE_SPOT>& out, std::string& reason)
 {
     const T_HINGE_COMPONENT& c = At(type, component);
     std::vector<T_HINGE_SPOT> spots;
-    if (kind != ELEM_KIND::Beam) {
-        spots = {{0.5, "C", c.location == HINGE_LOCATION::JEnd && !c.sameEnds}};
+    if (span.kind != ELEM_KIND::Beam) {
+        const double at = span.kind == ELEM_KIND::Truss ? 0.5 : 0.0; // links have no length
+        spots = {{at, "C", c.location == HINGE_LOCATION::JEnd && !c.sameEnds}};
     } else if (type.definition == HINGE_DEFINITION::CurvatureDistributed) {
-        if (!Distributed(type, c, elementLength, spots, reason)) return 0;
+        if (!Distributed(type, c, span.length, spots, reason)) return 0;
         out = std::move(spots);
         return 1;
     } else {
-        spots = Ends(c, component);
+        spots = Ends(c, component, span.isLoaded);
     }
     if (type.definition != HINGE_DEFINITION::MomentRotation && HasLineElement(type)) {
         const auto index = static_cast<std::size_t>(component);
         for (T_HINGE_SPOT& spot : spots) {
             const auto& lengths = type.length.components;
             const double length = (spot.end == "J" ? lengths.J : lengths.I)[index];
-            spot.length = type.length.relative ? length * memberLength : length;
+            spot.length = type.length.relative ? length * span.memberLength : length;
             if (!(spot.length > 0.0) || !std::isfinite(spot.length)) {
                 reason = Say("IDS_QM_PUSH_LAW_LENGTH", spot.end);
                 return 0;

@@ -39,6 +39,7 @@ public:
         : m_doc(doc), m_model(doc.Data().Model()), m_elements(elements), m_options(options),
           m_sources(m_model.sections, m_model.materials, kSi), m_generator(doc)
     {
+        FindLoaded();
     }
 
     int Build(T_PUSH_HINGES& out, std::string& error)
@@ -122,9 +123,9 @@ private:
             return Fail(page, Say("IDS_QM_PUSH_HINGE_VYVZ"));
         std::vector<T_HINGE_SPOT> spots;
         std::string reason;
-        if (!HingeSpots(page.type, page.component, page.element.kind, FlexibleLength(page.element),
-                        page.memberLength, spots, reason))
-            return Fail(page, reason);
+        const T_HINGE_SPAN span{page.element.kind, FlexibleLength(page.element), page.memberLength,
+                                IsLoaded(page.element)};
+        if (!HingeSpots(page.type, page.component, span, spots, reason)) return Fail(page, reason);
         for (const T_HINGE_SPOT& spot : spots)
             if (!AddSpot(page, spot)) return 0;
         return 1;
@@ -252,6 +253,23 @@ private:
         return std::sqrt(sum);
     }
 
+    /// A static load case has loads along the element, its weight included.
+    bool IsLoaded(const T_ELEM_D& e) const
+    {
+        const auto material = m_model.materials.find(e.material);
+        return m_loaded.contains(e.id) || (m_hasWeight && material != m_model.materials.end() &&
+                                           material->second.density > 0.0);
+    }
+    void FindLoaded()
+    {
+        for (const auto& [key, load] : m_model.loadCases) {
+            const auto& w = load.selfWeight;
+            m_hasWeight = m_hasWeight || w[0] != 0.0 || w[1] != 0.0 || w[2] != 0.0;
+            for (const T_BEAM_LOAD& l : load.beam)
+                m_loaded.insert(l.element);
+        }
+    }
+
     /// My and Mz share one surface.
     static bool IsBiaxial(const T_PHGT_D& type)
     {
@@ -336,6 +354,8 @@ private:
     CHingeSources m_sources;
     CHingeGenerator m_generator;
     std::set<std::tuple<std::size_t, double, std::size_t>> m_taken; // element, place, component
+    std::set<int> m_loaded;   // elements with loads along them
+    bool m_hasWeight = false; // some load case has
     T_PUSH_HINGES m_out;
     const T_PHGE_D* m_record = nullptr;
     std::size_t m_first = 0;

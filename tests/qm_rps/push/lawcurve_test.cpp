@@ -264,21 +264,29 @@ TEST(LawPlaces, DistributedHingesStandAtLobattoPoints)
     const double weight[] = {0.05, 49.0 / 180, 16.0 / 45, 49.0 / 180, 0.05};
     T_PHGT_D type;
     type.definition = HINGE_DEFINITION::CurvatureDistributed;
+    T_HINGE_SPAN span{ELEM_KIND::Beam, 4.0, 8.0, false};
     std::vector<T_HINGE_SPOT> spots;
     std::string reason;
-    ASSERT_EQ(1, HingeSpots(type, HINGE_COMPONENT::My, ELEM_KIND::Beam, 4.0, 8.0, spots, reason));
+    ASSERT_EQ(1, HingeSpots(type, HINGE_COMPONENT::My, span, spots, reason));
     ASSERT_EQ(5u, spots.size());
     for (std::size_t i = 0; i < 5; ++i) {
         EXPECT_NEAR(at[i], spots[i].at, 1e-15);
         EXPECT_NEAR(4.0 * weight[i], spots[i].length, 1e-14);
     }
     type.definition = HINGE_DEFINITION::CurvatureLumped;
-    EXPECT_EQ(0, HingeSpots(type, HINGE_COMPONENT::My, ELEM_KIND::Beam, 4.0, 8.0, spots, reason));
+    EXPECT_EQ(0, HingeSpots(type, HINGE_COMPONENT::My, span, spots, reason));
     type.length.relative = true;
     type.length.components.I[4] = 0.05, type.length.components.J[4] = 0.1;
-    ASSERT_EQ(1, HingeSpots(type, HINGE_COMPONENT::My, ELEM_KIND::Beam, 4.0, 8.0, spots, reason));
+    ASSERT_EQ(1, HingeSpots(type, HINGE_COMPONENT::My, span, spots, reason));
     EXPECT_EQ((std::vector<T_HINGE_SPOT>{{0.0, "I", false, 0.4}, {1.0, "J", false, 0.8}}), spots);
     type.definition = HINGE_DEFINITION::MomentRotation;
-    ASSERT_EQ(1, HingeSpots(type, HINGE_COMPONENT::Fx, ELEM_KIND::Truss, 4.0, 8.0, spots, reason));
+    // Both ends of an unloaded beam carry the same shear: one hinge.
+    ASSERT_EQ(1, HingeSpots(type, HINGE_COMPONENT::Fz, span, spots, reason));
     EXPECT_EQ((std::vector<T_HINGE_SPOT>{{0.5, "C", false, 1.0}}), spots);
+    span.isLoaded = true;
+    ASSERT_EQ(1, HingeSpots(type, HINGE_COMPONENT::Fz, span, spots, reason));
+    EXPECT_EQ(2u, spots.size());
+    span.kind = ELEM_KIND::Link;
+    ASSERT_EQ(1, HingeSpots(type, HINGE_COMPONENT::Fz, span, spots, reason));
+    EXPECT_EQ((std::vector<T_HINGE_SPOT>{{0.0, "C", false, 1.0}}), spots);
 }
