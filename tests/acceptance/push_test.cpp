@@ -3,8 +3,10 @@
 #include "pushcase.h"
 
 #include <array>
+#include <fstream>
 #include <limits>
 #include <map>
+#include <sstream>
 
 namespace {
 
@@ -200,5 +202,36 @@ TEST_P(PushPath, IsThatOfTheIndependentCalculation)
 INSTANTIATE_TEST_SUITE_P(Frames, PushPath, testing::ValuesIn(kPaths), [](const auto& test) {
     return std::string(test.param.name) + (*test.param.pDelta ? "_" : "") + test.param.pDelta;
 });
+
+// ---- a frame of the examples against its recorded curve -----------------------------------------
+
+/// Columns 1 (load factor) and 4 (control displacement) of a recorder table, row by row.
+std::vector<std::array<double, 2>> Recorded(const std::string& path)
+{
+    std::ifstream in(ProjectFolder() / "examples" / path);
+    std::vector<std::array<double, 2>> rows;
+    for (std::string line; std::getline(in, line);) {
+        std::istringstream cells(line);
+        double loadFactor = 0.0, other = 0.0, displacement = 0.0;
+        if (cells >> loadFactor >> other >> other >> displacement)
+            rows.push_back({loadFactor, displacement});
+    }
+    return rows;
+}
+
+using PushExample = CPushTest;
+
+TEST_F(PushExample, SteelFrameFollowsItsRecordedCurveThroughTheLossOfStrength)
+{
+    const json push = Json("push @steel-frame-2-storey --case PX_HINGES").at(0);
+    const auto rows = Recorded("steel-frame-2-storey/recorders/mode1/disp_floors.out");
+    ASSERT_EQ(649U, rows.size()); // the state before the push first, then steps of 0.05 in
+    ASSERT_EQ(108U, push.at("load_factor").size());
+    for (std::size_t step = 0; step < 108; ++step) {
+        const auto& row = rows[6 * (step + 1)];
+        EXPECT_NEAR(row[1], push["displacement"][step], 1e-6) << step;
+        EXPECT_NEAR(row[0], push["load_factor"][step], 1e-5 * 143.2) << step; // of its peak
+    }
+}
 
 } // namespace

@@ -110,7 +110,7 @@ TEST_F(LoadCaseEdit, ANewCaseGetsAFreeKeyAndNameAndMustBeFilled)
     dialog.m_input = {.kind = 1, .directionIndex = 0};
     ASSERT_EQ(1, dialog.OnAddPattern(dialog.m_input));
     ASSERT_EQ(1, dialog.OnOK());
-    EXPECT_EQ(1, Model().pushovers.at(3).patternKind);
+    EXPECT_EQ(1, Model().pushovers.at(4).patternKind);
     dialog.m_case.control.reset(); // it has no results, so nothing would be left of it
     EXPECT_EQ(0, dialog.OnOK());
     EXPECT_EQ("IDS_QM_UI_POLC_NO_CONTROL", LastMessage());
@@ -129,7 +129,7 @@ TEST_F(LoadCaseEdit, AUsedCaseStaysAndItsUsersAreNamed)
     EXPECT_EQ(0, list.OnDelete());
     EXPECT_EQ("IDS_QM_UI_RECORD_USED", LastMessage());
     EXPECT_NE(std::string::npos, list.Messages().back().text.find("PX_MODE1 ATC-40 A"));
-    EXPECT_EQ(2U, Model().pushovers.size());
+    EXPECT_EQ(3U, Model().pushovers.size());
     EXPECT_FALSE(m_doc.Data().IsModified());
 }
 

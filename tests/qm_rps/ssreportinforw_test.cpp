@@ -23,7 +23,7 @@ TEST_F(Report, HoldsStoreysStepsAndResultsOfTheModel)
     // 2 x 0.062950310559 + 2 x 0.121770186335 kips s2/in
     EXPECT_NEAR(0.369440993788, info.storeys[0].mass[0], 1e-12);
     EXPECT_EQ(0.0, info.storeys[0].mass[1]);
-    ASSERT_EQ(2U, info.pushovers.size());
+    ASSERT_EQ(3U, info.pushovers.size());
     // Step 50 of PX_UNIFORM computed apart from the recorder files (row 51): sum of the base
     // reactions; over 168 the largest difference of a vertical pair of nodes, and of the storeys'
     // mass-weighted mean displacements.
