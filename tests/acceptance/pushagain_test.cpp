@@ -156,4 +156,56 @@ TEST_F(PushAgain, IsTheSameInOtherUnits)
     EXPECT_NEAR(base, b["base_reaction"].back().get<double>() / kKips, 1e-9 * std::fabs(base));
 }
 
+/// Area under a backbone of deformations and forces from 0 on, level beyond its end.
+double Area(const std::vector<std::array<double, 2>>& backbone, double deformation)
+{
+    double area = 0.0;
+    std::array<double, 2> last = backbone.front();
+    for (const auto& point : backbone) {
+        const double end = std::min(point[0], deformation);
+        if (end <= last[0]) continue;
+        const double share = (end - last[0]) / (point[0] - last[0]);
+        const double force = last[1] + share * (point[1] - last[1]);
+        area += 0.5 * (last[1] + force) * (end - last[0]);
+        last = point;
+    }
+    return area + std::max(0.0, deformation - last[0]) * last[1];
+}
+
+/// Work is a sum of trapezia over the vertices of the path, between which all is straight. The
+/// hinges dissipate what lies under their backbones; the rest is elastic: half of loads times
+/// displacements less half of hinge forces times plastic deformations.
+TEST_F(PushAgain, WorkOfTheLoadsIsElasticEnergyAndDissipation)
+{
+    json file = Data("bb_two_storey_unloading");
+    json at = json::array(); // steps at the vertices
+    for (const T_VERTEX& v : Found(Pushed(file)["events"]))
+        if (at.empty() || v.displacement > at.back()) at.push_back(v.displacement);
+    file["pushover"][0]["additional_displacements"] = at;
+    const json push = Pushed(file, " --nodes 3,5");
+    EXPECT_EQ(at.size(), push["additional"].size());
+
+    double work = 0.0, before = 0.0, movedBefore = 0.0, dissipated = 0.0;
+    for (std::size_t s = 0; s < push["load_factor"].size(); ++s) {
+        // The pattern is 1 at node 5 and 0.2 at node 3.
+        const json& nodes = push["nodes"];
+        const double moved = nodes["5"][s][0].get<double>() + 0.2 * nodes["3"][s][0].get<double>();
+        const double factor = push["load_factor"][s];
+        work += 0.5 * (before + factor) * (moved - movedBefore);
+        before = factor;
+        movedBefore = moved;
+        double elastic = 0.5 * factor * moved;
+        dissipated = 0.0;
+        for (const json& h : push["hinges"]) {
+            const double turned = h["deformation"][s];
+            elastic -= 0.5 * h["force"][s].get<double>() * turned;
+            dissipated += h["element"] <= 2
+                              ? Area({{0, 270}, {0.01, 285}, {0.03, 90}}, std::fabs(turned))
+                              : Area({{0, 180}, {0.02, 240}}, std::fabs(turned));
+        }
+        EXPECT_NEAR(work, elastic + dissipated, 1e-9 * work) << s;
+    }
+    EXPECT_LT(0.5 * work, dissipated);
+}
+
 } // namespace
