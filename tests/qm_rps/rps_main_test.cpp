@@ -106,7 +106,7 @@ TEST_F(RpsMain, TheSelectionRunsForKindOneAlone)
     int chosen = 0;
     m_view.m_run = [](zql::frx::MDialog& dialog) {
         auto& d = dynamic_cast<CPO_SelectLoadCaseDlg&>(dialog);
-        EXPECT_EQ(2U, d.Rows().size());
+        EXPECT_EQ(3U, d.Rows().size());
         d.SetSelected(9);
         EXPECT_EQ(0, d.OnOK()); // there is none
         d.SetSelected(2);
