@@ -26,6 +26,31 @@ void CPO_LoadCaseDlg::Data2Dlg(const T_POLC_D& data)
     m_patternsEdited = false;
 }
 
+void CPO_LoadCaseDlg::TakeCase(T_POLC_D record)
+{
+    m_patternsEdited = m_patternsEdited || record.patterns != m_case.patterns;
+    m_selected = -1;
+    m_case = std::move(record);
+}
+
+CPO_LoadCaseDlg::START CPO_LoadCaseDlg::Start() const
+{
+    if (!m_case.initialCase.empty()) return START::OtherCase;
+    return m_case.initialLoads ? START::Own : START::Global;
+}
+
+void CPO_LoadCaseDlg::SetStart(START start)
+{
+    if (start == Start()) return;
+    const std::vector<std::string> others = OtherCases();
+    if (start == START::OtherCase && others.empty()) return;
+    m_case.initialCase = start == START::OtherCase ? others.front() : std::string();
+    if (start == START::Own)
+        m_case.initialLoads = GlobalControl().initialLoads;
+    else
+        m_case.initialLoads.reset();
+}
+
 int CPO_LoadCaseDlg::Dlg2Data(T_POLC_D& data)
 {
     if (!CheckData()) return 0;

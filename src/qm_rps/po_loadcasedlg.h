@@ -45,6 +45,19 @@ public:
     /// The case as edited. A case without control data (another solver's) checks its name alone.
     T_POLC_D m_case;
     int m_selected = -1; // index of the selected pattern row
+    /// Takes another state of it, whose pattern rows may be others.
+    void TakeCase(T_POLC_D record);
+
+    /// Where the push starts: the initial loads of the global control, loads of its own, or the end
+    /// of another load case (the first other one, where none was named yet; without any the case
+    /// stays where it starts).
+    enum class START { Global, Own, OtherCase };
+    START Start() const;
+    void SetStart(START start);
+    /// Names of the other load cases.
+    std::vector<std::string> OtherCases() const;
+    /// What the case follows where it has nothing of its own.
+    T_POGC_D GlobalControl() const;
 
     T_PATTERN_INPUT m_input; // what OnAddPattern and OnModifyPattern of a window take
 

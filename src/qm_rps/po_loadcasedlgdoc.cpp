@@ -169,6 +169,18 @@ std::vector<std::string> CPO_LoadCaseDlg::FunctionNames() const
 {
     return Doc() ? NamesOf(Doc()->Data().Model().incrementFunctions) : std::vector<std::string>();
 }
+std::vector<std::string> CPO_LoadCaseDlg::OtherCases() const
+{
+    std::vector<std::string> names;
+    if (Doc())
+        for (const auto& [key, record] : Doc()->Data().Model().pushovers)
+            if (key != m_key) names.push_back(record.name);
+    return names;
+}
+T_POGC_D CPO_LoadCaseDlg::GlobalControl() const
+{
+    return Doc() ? Doc()->Data().Model().pushControl : T_POGC_D();
+}
 std::vector<int> CPO_LoadCaseDlg::LoadCaseKeys() const
 {
     return Doc() ? Doc()->Attr().GetStldKeys() : std::vector<int>();

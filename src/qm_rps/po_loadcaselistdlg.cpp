@@ -2,6 +2,7 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_rps/po_loadcasedlg.h"
+#include "qm_rps/pushovercasegeneratordlg.h"
 
 using zql::lib::MMSGFunction;
 
@@ -44,6 +45,16 @@ int CPO_LoadCaseListDlg::OnCopy()
     const int key = CPO_LoadCaseDlg::NextKey(*Doc());
     if (!Edit(kTitle, [&](CEditScope& edit) { return edit.Put(key, copy) != 0; })) return 0;
     m_selected = key;
+    return 1;
+}
+
+int CPO_LoadCaseListDlg::OnGenerate()
+{
+    CPushOverCaseGeneratorDlg generator;
+    generator.SetDoc(Doc());
+    generator.SetView(View());
+    if (!generator.DoModal()) return 0;
+    ShowMessage("IDS_QM_UI_POLC_EIGHT", generator.BasisText());
     return 1;
 }
 

@@ -21,6 +21,8 @@ public:
     /// from another solver gets control data, whose values have to be entered yet.
     [[nodiscard]] int OnCopy();
     [[nodiscard]] int OnDelete();
+    /// Runs the dialog that makes load cases at once, and shows what they were made with.
+    [[nodiscard]] int OnGenerate();
 
 private:
     int RunItem(int key);

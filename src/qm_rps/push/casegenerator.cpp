@@ -2,7 +2,6 @@
 
 #include "qm_base/say.h"
 #include "qm_db/recordfacts.h"
-#include "qm_db/records/recordunits.h"
 #include "qm_rps/push/loadalgebra.h"
 #include "qm_rps/push/pushstoreys.h"
 #include "qm_solver/framesolver.h"
@@ -83,10 +82,15 @@ std::size_t TopNodeOf(const T_MODEL& model, const CAnalysisModel& frame, std::si
     for (std::size_t i = 0; i < top.nodes.size(); ++i)
         for (std::size_t d = 0; d < 3; ++d)
             centre[d] += top.weights[i] * nodes[top.nodes[i]].xyz[d];
-    return *std::ranges::min_element(top.nodes, {}, [&](std::size_t node) {
+    const auto distance = [&](std::size_t node) {
         const solver::T_VEC3& at = nodes[node].xyz;
         return std::hypot(at[0] - centre[0], at[1] - centre[1], at[2] - centre[2]);
-    });
+    };
+    constexpr double kAlike = 1e-9; // of nodes that are equally far the first one counts
+    std::size_t nearest = top.nodes.front();
+    for (const std::size_t node : top.nodes)
+        if (distance(node) < distance(nearest) * (1.0 - kAlike)) nearest = node;
+    return nearest;
 }
 
 /// Makes the cases of one document.

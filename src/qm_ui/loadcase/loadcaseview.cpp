@@ -6,6 +6,7 @@
 #include "qm_rps/po_loadcasedlg.h"
 #include "qm_rps/po_loadcaselistdlg.h"
 #include "qm_rps/po_selectloadcasedlg.h"
+#include "qm_ui/loadcase/loadcasepages.h"
 
 #include <algorithm>
 
@@ -36,11 +37,6 @@ bool ByDisplacement(const D& d)
 {
     return HasControl(d) && d.m_case.control->incrementMethod == kByDisplacement;
 }
-bool ByForce(const D& d)
-{
-    return HasControl(d) && !ByDisplacement(d);
-}
-
 /// Index in a list of keys; -1: not there.
 int IndexOf(const std::vector<int>& keys, int key)
 {
@@ -64,18 +60,19 @@ TextFn LengthCaption(const D& d, const char* key)
     };
 }
 
-void BuildForce(CFormView& form, D& d)
+/// What both methods have.
+void BuildIncrements(CFormView& form, D& d)
 {
-    const auto byForce = [&d] { return ByForce(d); };
+    const auto has = [&d] { return HasControl(d); };
     const auto follows = [&d] {
-        return ByForce(d) && d.m_case.control->incrementOption == kFollowsFunction;
+        return HasControl(d) && d.m_case.control->incrementOption == kFollowsFunction;
     };
     const T_BINDING<int> option = Control(d, &T_POLC_CONTROL::incrementOption);
     const T_BINDING<int> function = Control(d, &T_POLC_CONTROL::incrementFunction);
     form.Flag(KeyText("IDS_QM_UI_POLC_BY_FUNCTION"),
               {[option] { return option.get() == kFollowsFunction; },
                [option](bool on) { option.set(on ? kFollowsFunction : 0); }})
-        .shown = byForce;
+        .shown = has;
     CFormField& list =
         form.Choice(KeyText("IDS_QM_UI_POLC_FUNCTION"),
                     {[&d, function] { return IndexOf(d.FunctionKeys(), function.get()); },
@@ -88,13 +85,13 @@ void BuildForce(CFormView& form, D& d)
     CFormField& ratio = form.Number(KeyText("IDS_QM_UI_POLC_RATIO"),
                                     Control(d, &T_POLC_CONTROL::stiffnessRatioLimit));
     ratio.name = "control.stiffnessRatioLimit";
-    ratio.shown = byForce;
+    ratio.shown = has;
     form.Flag(KeyText("IDS_QM_UI_POLC_ANGLE_ON"), Control(d, &T_POLC_CONTROL::generateStaticAngle))
-        .shown = byForce;
+        .shown = has;
     CFormField& angle =
         form.Number(KeyText("IDS_QM_UI_POLC_ANGLE"), Control(d, &T_POLC_CONTROL::staticAngle));
     angle.name = "control.staticAngle";
-    angle.shown = byForce;
+    angle.shown = has;
     angle.enabled = [&d] { return HasControl(d) && d.m_case.control->generateStaticAngle; };
 }
 
@@ -142,8 +139,8 @@ void BuildControl(CFormView& form, D& d)
                     KeyTexts({"IDS_RPS_PUSHOVER_DISP_CTRL", "IDS_RPS_PUSHOVER_FORCE_CTRL"}));
     choice.name = "method";
     choice.enabled = [&d] { return HasControl(d); };
-    BuildForce(form, d);
     BuildDisplacement(form, d);
+    BuildIncrements(form, d);
 }
 
 void BuildGeneral(CFormView& form, D& d)
@@ -250,6 +247,12 @@ void BuildItem(CFormView& form, D& d)
     form.EndGroup();
     form.Page(KeyText("IDS_QM_UI_POLC_PATTERNS"));
     BuildPatterns(form, d);
+    form.Number(KeyText("IDS_QM_UI_POLC_ECCENTRICITY"), Ref(d.m_case.eccentricity)).name =
+        "eccentricity";
+    form.Page(KeyText("IDS_QM_UI_POLC_PAGE_START"));
+    BuildLoadCaseStart(form, d);
+    form.Page(KeyText("IDS_QM_UI_POLC_PAGE_STOPS"));
+    BuildLoadCaseStops(form, d);
     form.EndPages();
 }
 
@@ -290,7 +293,8 @@ void BuildList(CFormView& form, CPO_LoadCaseListDlg& d)
         {"IDS_QM_UI_POLC_ADD", &CPO_LoadCaseListDlg::OnAdd, false},
         {"IDS_QM_UI_POLC_MODIFY", &CPO_LoadCaseListDlg::OnModify, true},
         {"IDS_QM_UI_POLC_COPY", &CPO_LoadCaseListDlg::OnCopy, true},
-        {"IDS_QM_UI_POLC_DELETE", &CPO_LoadCaseListDlg::OnDelete, true}};
+        {"IDS_QM_UI_POLC_DELETE", &CPO_LoadCaseListDlg::OnDelete, true},
+        {"IDS_QM_UI_POLC_EIGHT_BUTTON", &CPO_LoadCaseListDlg::OnGenerate, false}};
     T_GRID_BINDING grid = RowGrid(
         d, [&d] { return d.m_selected; }, [&d](int key) { d.m_selected = key; });
     grid.open = [&d](std::size_t) { (void)d.OnModify(); };
