@@ -91,4 +91,5 @@ void AddCase(CLI::App& app, EXIT_CODE& code)
     check->add_option("FILE", *file, Say("IDS_QM_HELP_FILE"))->required();
     AddExample(check, "case check examples/hinge-library/case.json");
     check->callback([=, &code] { code = RunCaseCheck(*file); });
+    AddCaseGenerate(*cases, code);
 }

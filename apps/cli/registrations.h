@@ -25,4 +25,7 @@ void AddCase(CLI::App& app, EXIT_CODE& code);
 void AddAnalyse(CLI::App& app, EXIT_CODE& code);
 void AddUlf(CLI::App& app, EXIT_CODE& code);
 void AddPush(CLI::App& app, EXIT_CODE& code);
+/// Commands below "push" and below "case".
+void AddPushSetup(CLI::App& push, EXIT_CODE& code);
+void AddCaseGenerate(CLI::App& cases, EXIT_CODE& code);
 void AddReport(CLI::App& app, EXIT_CODE& code);

@@ -7,7 +7,7 @@ void AddPush(CLI::App& app, EXIT_CODE& code)
 {
     auto* sub = app.add_subcommand("push", Say("IDS_QM_HELP_PUSH"));
     auto o = std::make_shared<T_PUSH_OPTIONS>();
-    AddFile(sub, o->file);
+    AddFile(sub, o->file)->required(false); // a command below has its own
     sub->add_option("--case", o->cases, Say("IDS_QM_HELP_PUSH_CASE"));
     sub->add_flag("--all", o->all, Say("IDS_QM_HELP_PUSH_ALL"));
     AddJson(sub, o->json);
@@ -18,5 +18,10 @@ void AddPush(CLI::App& app, EXIT_CODE& code)
     AddOverwrite(sub, o->overwrite);
     sub->add_flag("--no-store", o->noStore, Say("IDS_QM_HELP_ANALYSE_NO_STORE"));
     AddExample(sub, "push examples/masonry-wall/case.json --all");
-    sub->callback([o, &code] { code = RunPush(*o); });
+    AddPushSetup(*sub, code);
+    sub->callback([=, &code] {
+        if (!sub->get_subcommands().empty()) return;
+        if (o->file.empty()) throw CLI::RequiredError("FILE");
+        code = RunPush(*o);
+    });
 }
