@@ -12,11 +12,15 @@
 #include "qm_rps/po_loadcasedlg.h"
 #include "qm_rps/po_loadcaselistdlg.h"
 #include "qm_rps/po_selectloadcasedlg.h"
+#include "qm_rps/pushovercasegeneratordlg.h"
+#include "qm_rps/pushoverglobalcontroldlg.h"
+#include "qm_rps/pushoverincrementfunctiondlg.h"
 #include "qm_rps/rps_main.h"
 #include "qm_ui/form/dialogwindow.h"
 #include "qm_ui/hinge/figureview.h"
 #include "qm_ui/hinge/inelastichingeview.h"
 #include "qm_ui/loadcase/loadcaseview.h"
+#include "qm_ui/push/pushsetupviews.h"
 
 #include <QEvent>
 #include <QTabWidget>
@@ -80,6 +84,19 @@ void InstallWindows(T_DESKTOP& desktop)
     });
 }
 
+/// Runs a dialog on the document.
+template <class MODEL>
+std::function<void()> Modal(T_DESKTOP& desktop)
+{
+    return [&desktop] {
+        MODEL dialog;
+        dialog.SetDoc(&desktop.doc);
+        dialog.SetView(&desktop.view);
+        (void)dialog.DoModal();
+        desktop.changed();
+    };
+}
+
 /// A figure, asked for as other modules of the host do.
 std::function<void()> Figure(int kind)
 {
@@ -94,6 +111,7 @@ std::function<void()> Figure(int kind)
 void RegisterLoadCaseViews(CViewFactory& factory)
 {
     RegisterLoadCaseForms(factory);
+    RegisterPushSetupForms(factory);
     RegisterFigureViews(factory);
     RegisterInelasticHingeView(factory);
     (void)RegisterRPSService(); // 0 where another agency has the name: its services are then used
@@ -106,15 +124,10 @@ T_COMMANDS LoadCaseCommands(T_DESKTOP& desktop)
     const auto list = [&desktop] {
         (void)CreateOrActivateRPSDlg(&desktop.doc, IDD_PO_LOADCASE_LIST, &desktop.view, nullptr);
     };
-    const auto inelastic = [&desktop] {
-        CPO_InelasticHingeDlg hinges;
-        hinges.SetDoc(&desktop.doc);
-        hinges.SetView(&desktop.view);
-        (void)hinges.DoModal();
-        desktop.changed();
-    };
     return {{kMenu, "IDS_QM_UI_POLC_LIST", "Ctrl+Shift+P", list},
-            {kMenu, "IDS_QM_UI_IEHP_MENU", "", inelastic},
+            {kMenu, "IDS_QM_UI_POGC_MENU", "", Modal<CPushOverGlobalControlDlg>(desktop)},
+            {kMenu, "IDS_QM_UI_POFC_MENU", "", Modal<CPushOverIncrementFunctionDlg>(desktop)},
+            {kMenu, "IDS_QM_UI_IEHP_MENU", "", Modal<CPO_InelasticHingeDlg>(desktop)},
             {kMenu},
             {kMenu, "IDS_QM_UI_FIGURE_MENU_0", "", Figure(3)},
             {kMenu, "IDS_QM_UI_FIGURE_MENU_E", "", Figure(4)},
@@ -146,17 +159,34 @@ T_WINDOW_EXAMPLE ExampleOf(const char* name, const char* model,
             }};
 }
 
-void FillItem(CMainWindow& main, CPO_LoadCaseDlg& dialog)
+/// The same window with another page in front.
+T_WINDOW_EXAMPLE OnPage(T_WINDOW_EXAMPLE example, int page)
+{
+    example.make = [make = example.make, page](CMainWindow& main) {
+        std::unique_ptr<QWidget> window = make(main);
+        for (QTabWidget* tabs : window->findChildren<QTabWidget*>())
+            tabs->setCurrentIndex(page);
+        return window;
+    };
+    return example;
+}
+
+template <class MODEL>
+void OnDocument(CMainWindow& main, MODEL& dialog)
 {
     dialog.SetDoc(&main.Doc());
 }
 
-/// Its second page.
-std::unique_ptr<QWidget> ShowPatterns(std::unique_ptr<QWidget> window)
+/// A case with everything of its own.
+void FillOwn(CMainWindow& main, CPO_LoadCaseDlg& dialog)
 {
-    for (QTabWidget* tabs : window->findChildren<QTabWidget*>())
-        tabs->setCurrentIndex(1);
-    return window;
+    dialog.SetDoc(&main.Doc());
+    dialog.SetStart(CPO_LoadCaseDlg::START::Own);
+    dialog.m_case.pDelta = PUSH_P_DELTA::Updated;
+    dialog.m_case.steps = 50;
+    dialog.m_case.stops = {0.03, PUSH_STATE_STOP::CP, 0.8};
+    dialog.m_case.additionalDisplacements = {0.05, 0.1};
+    dialog.m_case.additionalEvaluations = true;
 }
 
 /// A new case with rules that are not kept.
@@ -185,10 +215,17 @@ std::vector<T_WINDOW_EXAMPLE> LoadCaseWindowExamples()
 {
     constexpr const char* kFrame = "rc-frame-3-storey";
     constexpr const char* kHinges = "hinge-library";
-    T_WINDOW_EXAMPLE pattern = ExampleOf<CPO_LoadCaseDlg>("loadcase-pattern", kFrame, FillNew);
-    pattern.make = [make = pattern.make](CMainWindow& main) { return ShowPatterns(make(main)); };
-    return {ExampleOf<CPO_LoadCaseDlg>("loadcase-item", kHinges, FillItem),
-            pattern,
+    constexpr const char* kBuilding = "eccentric-building";
+    return {ExampleOf<CPO_LoadCaseDlg>("loadcase-item", kHinges, OnDocument<CPO_LoadCaseDlg>),
+            OnPage(ExampleOf<CPO_LoadCaseDlg>("loadcase-pattern", kFrame, FillNew), 1),
+            OnPage(ExampleOf<CPO_LoadCaseDlg>("loadcase-start", kBuilding, FillOwn), 2),
+            OnPage(ExampleOf<CPO_LoadCaseDlg>("loadcase-stops", kBuilding, FillOwn), 3),
+            ExampleOf<CPushOverCaseGeneratorDlg>("loadcase-eight", kBuilding,
+                                                 OnDocument<CPushOverCaseGeneratorDlg>),
+            ExampleOf<CPushOverGlobalControlDlg>("push-global-control", kBuilding,
+                                                 OnDocument<CPushOverGlobalControlDlg>),
+            ExampleOf<CPushOverIncrementFunctionDlg>("push-increment-functions", kHinges,
+                                                     OnDocument<CPushOverIncrementFunctionDlg>),
             ExampleOf<CPO_LoadCaseDlg>("loadcase-new", kFrame, FillNew),
             ExampleOf<CPO_LoadCaseListDlg>("loadcase-list", kFrame,
                                            [](CMainWindow& main, CPO_LoadCaseListDlg& dialog) {
