@@ -126,16 +126,7 @@ void CFramePane::SetStep(int step)
 
 void CFramePane::ResetCamera()
 {
-    switch (CFrameScene::FlatAxis(m_scene.Scene())) {
-    case 0:
-        return m_view->SetCamera(kElevationYZ);
-    case 1:
-        return m_view->SetCamera(kElevationXZ);
-    case 2:
-        return m_view->SetCamera(kPlanXY);
-    default:
-        return m_view->SetCamera(kIsometric);
-    }
+    m_view->SetCamera(CameraFor(CFrameScene::FlatAxis(m_scene.Scene())));
 }
 
 /// The last step of the chosen source, in a scale that suits it.

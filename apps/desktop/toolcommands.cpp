@@ -3,10 +3,12 @@
 #include "hingetools.h"
 #include "loadcasetools.h"
 #include "pushovertools.h"
+#include "pushtools.h"
 #include "ulftools.h"
 
 void RegisterViews(CViewFactory& factory)
 {
+    RegisterPushViews(factory);
     RegisterPushoverViews(factory);
     RegisterLoadCaseViews(factory);
     RegisterHingeViews(factory);
@@ -16,8 +18,9 @@ void RegisterViews(CViewFactory& factory)
 T_COMMANDS ToolCommands(T_DESKTOP& desktop)
 {
     T_COMMANDS all;
-    for (const T_COMMANDS& part : {PushoverCommands(desktop), LoadCaseCommands(desktop),
-                                   HingeCommands(desktop), UlfCommands(desktop)})
+    for (const T_COMMANDS& part :
+         {PushCommands(desktop), PushoverCommands(desktop), LoadCaseCommands(desktop),
+          HingeCommands(desktop), UlfCommands(desktop)})
         all.insert(all.end(), part.begin(), part.end());
     return all;
 }

@@ -4,6 +4,7 @@
 #include "loadcasetools.h"
 #include "mainwindow.h"
 #include "pushovertools.h"
+#include "pushtools.h"
 #include "ulftools.h"
 
 std::vector<T_WINDOW_EXAMPLE> WindowExamples()
@@ -25,8 +26,8 @@ std::vector<T_WINDOW_EXAMPLE> WindowExamples()
                                       {"main-pushover", "rc-frame-3-storey", shown(KIND::Pushover)},
                                       {"main-bridge", "cable-stayed-bridge", shown(KIND::Static)},
                                       {"main-space", "space-frame-3d", shown(KIND::Static)}};
-    for (auto& part : {PushoverWindowExamples(), LoadCaseWindowExamples(), HingeWindowExamples(),
-                       UlfWindowExamples()})
+    for (auto& part : {PushWindowExamples(), PushoverWindowExamples(), LoadCaseWindowExamples(),
+                       HingeWindowExamples(), UlfWindowExamples()})
         all.insert(all.end(), part.begin(), part.end());
     return all;
 }

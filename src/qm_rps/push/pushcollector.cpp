@@ -37,10 +37,12 @@ CPushCollector::CPushCollector(const T_MODEL& model, const CAnalysisModel& frame
     m_lawAt.resize(hinges.hinges.size());
     for (std::size_t i = 0; i < hinges.laws.size(); ++i) {
         m_lawAt[hinges.laws[i].hinge].push_back(i);
-        m_run.hinges.push_back({hinges.laws[i], {}, {}, {}});
+        const solver::T_PUSH_HINGE& hinge = hinges.hinges[hinges.laws[i].hinge];
+        m_run.hinges.push_back(
+            {hinges.laws[i], hinge.laws[hinges.laws[i].law], hinge.biaxial, {}, {}, {}});
     }
     for (const T_PUSH_STOREY& storey : m_storeys)
-        m_run.storeys.push_back({storey.name, {}, {}, {}});
+        m_run.storeys.push_back({storey.name, storey.elevation, storey.height, {}, {}, {}});
     m_run.name = c.name;
     m_run.key = c.key;
     m_run.direction = c.direction;
@@ -69,10 +71,9 @@ bool CPushCollector::Take(const solver::T_PUSH_STEP& step)
     for (std::size_t i = 0; i < m_run.hinges.size(); ++i) {
         T_PUSH_HINGE_SERIES& series = m_run.hinges[i];
         const solver::T_HINGE_STATE& state = step.hinges[i];
-        const auto& law = m_hinges.hinges[series.place.hinge].laws[series.place.law];
         series.deformation.push_back(state.deformation);
         series.force.push_back(state.force);
-        series.state.push_back(StateOf(series.place, law, state));
+        series.state.push_back(StateOf(series.place, series.law, state));
     }
     TakeStoreys(step);
     m_recorder.Add(step);

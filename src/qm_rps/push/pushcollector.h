@@ -3,12 +3,19 @@
 
 #include "qm_rps/push/pushrun.h"
 
+#include <algorithm>
+
 /// Steps and events of the last stage become the results of the case.
 class CPushCollector {
 public:
     CPushCollector(const T_MODEL& model, const CAnalysisModel& frame, const T_PUSH_HINGES& hinges,
                    const T_PUSH_CASE& c);
 
+    /// Load factors at the ends of the stages before the case, where their steps are not told.
+    void SetFactorsBefore(const std::vector<double>& factors)
+    {
+        std::ranges::copy(factors, m_factors.begin());
+    }
     /// True: the step is one of the case.
     bool Take(const solver::T_PUSH_STEP& step);
     void Take(const solver::T_PUSH_EVENT& event);

@@ -153,39 +153,128 @@ void CPushRun::Keep(std::vector<T_PUSH_RUN>& runs)
         m_doc.Data().SetPushRuns(key, all);
 }
 
-int CPushRun::Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_RUN>& out,
-                  std::string& error, const std::vector<double>& extra)
+int CPushRun::PrepareCases(int key, std::vector<T_PUSH_CASE>& out, T_PREPARED*& on,
+                           std::string& error)
 {
     const auto record = m_model.pushovers.find(key);
     if (record == m_model.pushovers.end()) {
         error = Say("IDS_QM_PUSH_NO_INITIAL_CASE");
         return 0;
     }
-    const auto fail = [&] {
-        error = Say("IDS_QM_PUSH_CASE_QUOTED", record->second.name) + ": " + error;
-        return 0;
-    };
+    if (!BuildFrame(error)) return 0;
     std::vector<int> chain;
     T_PUSH_BASIS basis;
-    T_PREPARED* on = nullptr;
-    if (!BuildFrame(error)) return 0;
-    if (!PushChainOf(m_model, key, chain, error) || !PushBasisOf(m_model, chain, basis, error) ||
-        !Prepare(basis, on, error))
-        return fail();
     // Shapes that the engine makes belong to the case at the end of the chain.
     const MODE_SHAPE_FN shape = [&](int mode, std::string& why) {
         return ModeShape(*on, mode, record->second, why);
     };
+    if (PushChainOf(m_model, key, chain, error) && PushBasisOf(m_model, chain, basis, error) &&
+        Prepare(basis, on, error) && BuildPushCases(m_model, m_frame, chain, shape, out, error))
+        return 1;
+    error = Say("IDS_QM_PUSH_CASE_QUOTED", record->second.name) + ": " + error;
+    return 0;
+}
+
+int CPushRun::Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_RUN>& out,
+                  std::string& error, const std::vector<double>& extra)
+{
+    T_PREPARED* on = nullptr;
     std::vector<T_PUSH_CASE> cases;
-    if (!BuildPushCases(m_model, m_frame, chain, shape, cases, error)) return fail();
+    if (!PrepareCases(key, cases, on, error)) return 0;
     std::vector<T_PUSH_RUN> runs;
     for (T_PUSH_CASE& c : cases) {
         std::vector<double>& additional = c.stages.back().additional;
         additional.insert(additional.end(), extra.begin(), extra.end());
-        if (!RunCase(*on, c, progress, runs.emplace_back(), error)) return fail();
+        if (!RunCase(*on, c, progress, runs.emplace_back(), error)) {
+            error = Say("IDS_QM_PUSH_CASE_QUOTED", m_model.pushovers.at(key).name) + ": " + error;
+            return 0;
+        }
         if (runs.back().cancelled) break;
     }
     out.insert(out.end(), std::make_move_iterator(runs.begin()),
                std::make_move_iterator(runs.end()));
+    return 1;
+}
+
+/// Load factors at the ends of the cases that this one starts from; empty: their results are not
+/// there any more.
+std::optional<std::vector<double>> CPushRun::FactorsBefore(int key)
+{
+    std::vector<int> chain;
+    std::vector<double> out, factors;
+    std::string error;
+    if (!PushChainOf(m_model, key, chain, error)) return std::nullopt;
+    chain.pop_back();
+    for (const int before : chain) {
+        IPushRun* const run = m_doc.Post().RunOf(before);
+        if (!run || m_doc.Post().IsStale(before, error) || !run->ReadLoadFactors(factors) ||
+            factors.empty())
+            return std::nullopt;
+        out.push_back(factors.back());
+    }
+    return out;
+}
+
+namespace {
+
+/// A stored step as the engine gave it.
+solver::T_PUSH_STEP StepOf(const T_RUN_DATA& data, std::size_t i, const T_PUSH_HINGES& hinges)
+{
+    const T_RUN_STEP& from = data.steps[i];
+    solver::T_PUSH_STEP step{static_cast<std::size_t>(from.stage),
+                             from.loadFactor,
+                             from.displacement,
+                             from.base,
+                             from.residual,
+                             from.additional,
+                             data.displacement[i],
+                             {},
+                             std::vector<double>(hinges.hinges.size())};
+    for (std::size_t h = 0; h < hinges.laws.size(); ++h) {
+        const T_RUN_STATE& state = data.states[i][h];
+        step.hinges.push_back({state.deformation, state.force, state.place});
+        step.axial[hinges.laws[h].hinge] = state.axial;
+    }
+    return step;
+}
+
+solver::T_PUSH_EVENT EventOf(const T_RUN_EVENT& from, const T_PUSH_HINGES& hinges)
+{
+    solver::T_PUSH_EVENT event{from.stage, from.loadFactor, from.displacement, from.base, {}};
+    for (const T_RUN_TURN& turn : from.turns) {
+        const T_PUSH_LAW_PLACE& place = hinges.laws[static_cast<std::size_t>(turn.hinge)];
+        event.hinges.push_back({place.hinge, place.law, turn.turn, turn.point, turn.positive});
+    }
+    return event;
+}
+
+} // namespace
+
+int CPushRun::Read(int key, int turn, T_PUSH_RUN& out, std::string& error)
+{
+    IPushRun* const stored = m_doc.Post().RunOf(key, turn);
+    T_RUN_DATA data;
+    T_PREPARED* on = nullptr;
+    std::vector<T_PUSH_CASE> cases;
+    error = Say("IDS_QM_PUSH_NO_RUN");
+    if (!stored || m_doc.Post().IsStale(key, error, turn) || !ReadWholeRun(*stored, data, error) ||
+        !PrepareCases(key, cases, on, error))
+        return 0;
+    const auto c = std::ranges::find(cases, turn, &T_PUSH_CASE::turn);
+    if (c == cases.end() || data.hinges.size() != on->hinges.laws.size() || data.steps.empty())
+        return 0;
+    CPushCollector collector(m_model, m_frame, on->hinges, *c);
+    const auto before = FactorsBefore(key);
+    if (before) collector.SetFactorsBefore(*before);
+    for (std::size_t i = 0; i < data.steps.size(); ++i)
+        (void)collector.Take(StepOf(data, i, on->hinges));
+    for (const T_RUN_EVENT& event : data.events)
+        collector.Take(EventOf(event, on->hinges));
+    const T_RUN_END& end = data.head.end;
+    out = collector.Finish({end.outcome, static_cast<std::size_t>(end.stage), end.loadFactor,
+                            end.displacement, -1, -1});
+    if (!before)
+        for (T_PUSH_STOREY_SERIES& storey : out.storeys)
+            storey.shear.clear();
     return 1;
 }

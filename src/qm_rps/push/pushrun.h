@@ -11,6 +11,8 @@
 /// A component of a hinge over the steps.
 struct T_PUSH_HINGE_SERIES {
     T_PUSH_LAW_PLACE place;
+    solver::T_HINGE_LAW law;                // as it was used
+    bool biaxial = false;                   // My and Mz share one surface
     std::vector<double> deformation, force; // beyond the elastic member; as an analysis prints it
     std::vector<PUSH_STATE> state;
 };
@@ -27,7 +29,9 @@ struct T_PUSH_EVENT_ROW {
 
 struct T_PUSH_STOREY_SERIES {
     std::string name;
-    std::vector<double> displacement, drift, shear;
+    double elevation = 0.0, height = 0.0; // of its top, and down to the storey below
+    std::vector<double> displacement, drift;
+    std::vector<double> shear; // empty: not known (loads of cases before this one are in it)
 };
 
 /// One result of a load case, in SI; index 0 is step 1. Along the direction of control, totals:
@@ -71,12 +75,19 @@ public:
     [[nodiscard]] int Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_RUN>& out,
                           std::string& error, const std::vector<double>& extra = {});
 
+    /// The results of a load case that the document has, as Run gives them: states and storey
+    /// values are made again from the stored steps. 1 done; 0 `error` says why not (there are none
+    /// of our own, they can't be read, or they are older than the model), `out` unchanged.
+    [[nodiscard]] int Read(int key, int turn, T_PUSH_RUN& out, std::string& error);
+
     /// Puts the results of a load case, as Run gives them, in place of those that the document has.
     void Keep(std::vector<T_PUSH_RUN>& runs);
 
 private:
     struct T_PREPARED;
     int BuildFrame(std::string& error);
+    int PrepareCases(int key, std::vector<T_PUSH_CASE>& out, T_PREPARED*& on, std::string& error);
+    std::optional<std::vector<double>> FactorsBefore(int key);
     int Prepare(const T_PUSH_BASIS& basis, T_PREPARED*& out, std::string& error);
     int PrepareNew(const T_PUSH_BASIS& basis, T_PREPARED& to, std::string& error);
     int AxialOf(const solver::T_LOAD_CASE& initial, T_PREPARED& to, std::string& error);

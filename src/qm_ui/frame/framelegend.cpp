@@ -10,6 +10,7 @@
 #include <QPainter>
 
 #include <algorithm>
+#include <array>
 #include <cmath>
 #include <functional>
 
@@ -45,6 +46,35 @@ T_ENTRY LineEntry(const char* key, const QPen& pen)
             }};
 }
 
+/// A filled circle up to C, a square beyond, a cross where the hinge has failed.
+struct T_STATE_LOOK {
+    QRgb color;
+    double radius;
+};
+constexpr std::array<T_STATE_LOOK, kPushStateNames.size()> kStateLooks{{
+    {0xffb0bec5, 3.0}, // elastic
+    {0xff43a047, 4.5}, // B-IO
+    {0xff1e88e5, 4.5}, // IO-LS
+    {0xfffdd835, 5.0}, // LS-CP
+    {0xfffb8c00, 5.0}, // CP-C
+    {0xff00acc1, 4.5}, // B-C
+    {0xffe53935, 4.5}, // C-D
+    {0xff8e24aa, 4.5}, // D-E
+    {0xff000000, 5.0}, // failed
+}};
+
+/// Every state of the run and how many hinges are in it now.
+void AddStates(const T_HINGE_MARKS& marks, std::vector<T_ENTRY>& out)
+{
+    for (std::size_t i = 0; i < kPushStateNames.size(); ++i) {
+        if (!marks.occurs[i]) continue;
+        const auto state = static_cast<PUSH_STATE>(i);
+        const auto count = std::ranges::count(marks.hinges, state, &T_HINGE_MARK::state);
+        out.push_back({QString::fromStdString(PushStateText(state) + ": " + std::to_string(count)),
+                       [state](QPainter& p, QPointF m) { DrawHingeState(p, m, state); }});
+    }
+}
+
 std::vector<T_ENTRY> Entries(const T_FRAME_PICTURE& picture, const T_FRAME_OPTIONS& options)
 {
     const T_FRAME_SCENE& scene = *picture.scene;
@@ -61,8 +91,10 @@ std::vector<T_ENTRY> Entries(const T_FRAME_PICTURE& picture, const T_FRAME_OPTIO
         out.push_back({Text("IDS_QM_UI_FRAME_SUPPORTS"), [](QPainter& p, QPointF m) {
                            p.fillRect(QRectF(m.x() - 5, m.y() - 3, 10, 6), kSupportColor);
                        }});
-    const bool hinged =
-        std::ranges::any_of(scene.lines, [](const auto& l) { return l.hingeI || l.hingeJ; });
+    if (options.hinges && picture.marks) AddStates(*picture.marks, out);
+    const bool hinged = !picture.marks && std::ranges::any_of(scene.lines, [](const auto& l) {
+        return l.hingeI || l.hingeJ;
+    });
     if (options.hinges && hinged)
         out.push_back({Text("IDS_QM_UI_FRAME_HINGES"), [](QPainter& p, QPointF m) {
                            p.setPen(Qt::NoPen);
@@ -168,6 +200,27 @@ QPen FramePen(ELEM_KIND kind, bool faint, bool thick)
     default:
         return {QColor(0x15, 0x4e, 0x8c), width};
     }
+}
+
+void DrawHingeState(QPainter& painter, QPointF at, PUSH_STATE state)
+{
+    const T_STATE_LOOK& look = kStateLooks[static_cast<std::size_t>(state)];
+    const double r = look.radius;
+    const QRectF box(at.x() - r, at.y() - r, 2 * r, 2 * r);
+    const QColor color(look.color);
+    if (state == PUSH_STATE::Failed) {
+        painter.setPen(QPen(color, 2.2));
+        painter.drawLine(box.topLeft(), box.bottomRight());
+        painter.drawLine(box.topRight(), box.bottomLeft());
+        return;
+    }
+    painter.setPen(QPen(color.darker(150), 0.8));
+    painter.setBrush(color);
+    if (state == PUSH_STATE::CtoD || state == PUSH_STATE::DtoE)
+        painter.drawRect(box);
+    else
+        painter.drawEllipse(box);
+    painter.setBrush(Qt::NoBrush);
 }
 
 QRectF DrawFrameLegend(QPainter* painter, const QRectF& rect, const T_FRAME_PICTURE& picture,

@@ -12,6 +12,9 @@ inline const QColor kHingeColor{0xef, 0x6c, 0x00};
 /// Pen of the lines of a kind of elements; faint: of the frame as it was.
 QPen FramePen(ELEM_KIND kind, bool faint, bool thick);
 
+/// A hinge in a state, by colour and shape.
+void DrawHingeState(QPainter& painter, QPointF at, PUSH_STATE state);
+
 /// Draws titles above, the legend below and drift bars at the right; returns what is left. Without
 /// a painter it only measures.
 QRectF DrawFrameLegend(QPainter* painter, const QRectF& rect, const T_FRAME_PICTURE& picture,

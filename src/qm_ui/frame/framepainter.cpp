@@ -16,6 +16,7 @@
 #include <cmath>
 #include <limits>
 #include <numbers>
+#include <numeric>
 #include <set>
 #include <utility>
 
@@ -25,6 +26,7 @@ constexpr double kMargin = 28.0;
 constexpr double kHit = 10.0;
 constexpr std::size_t kSmooth = 4000; // members up to which lines are smoothed
 constexpr double kCell = 34.0;        // px between numbers that are drawn
+constexpr double kFromEnd = 0.08;     // of a line: hinges at a joint stay apart
 
 using KIND = ELEM_KIND;
 constexpr std::array<KIND, 3> kKinds{KIND::Beam, KIND::Truss, KIND::Link};
@@ -149,7 +151,7 @@ void CFramePainter::DrawSupports(QPainter& painter, const T_FRAME_SCENE& scene) 
 
 void CFramePainter::DrawHinges(QPainter& painter, const T_FRAME_SCENE& scene) const
 {
-    constexpr double kRadius = 2.8, kFromEnd = 0.08;
+    constexpr double kRadius = 2.8;
     painter.setPen(Qt::NoPen);
     painter.setBrush(kHingeColor);
     for (const T_SCENE_LINE& line : scene.lines) {
@@ -158,6 +160,29 @@ void CFramePainter::DrawHinges(QPainter& painter, const T_FRAME_SCENE& scene) co
         if (line.hingeJ) painter.drawEllipse(j + kFromEnd * (i - j), kRadius, kRadius);
     }
     painter.setBrush(Qt::NoBrush);
+}
+
+/// The worst state on top.
+void CFramePainter::DrawMarks(QPainter& painter, const T_FRAME_PICTURE& picture)
+{
+    const auto& marks = picture.marks->hinges;
+    m_hinges.resize(marks.size());
+    m_order.resize(marks.size());
+    std::iota(m_order.begin(), m_order.end(), std::size_t{0});
+    std::ranges::stable_sort(m_order, {}, [&](std::size_t m) { return marks[m].state; });
+    for (const std::size_t m : m_order) {
+        m_hinges[m] = m_moved[marks[m].node];
+        if (marks[m].line >= 0) {
+            const auto& line = picture.scene->lines[static_cast<std::size_t>(marks[m].line)];
+            const double at = kFromEnd + (1.0 - 2.0 * kFromEnd) * marks[m].at;
+            m_hinges[m] = m_moved[line.i] + at * (m_moved[line.j] - m_moved[line.i]);
+        }
+        DrawHingeState(painter, m_hinges[m], marks[m].state);
+    }
+    const auto chosen = std::ranges::find(marks, true, &T_HINGE_MARK::chosen);
+    if (chosen == marks.end()) return;
+    painter.setPen(QPen(Qt::black, 1.6));
+    painter.drawEllipse(m_hinges[static_cast<std::size_t>(chosen - marks.begin())], 8.5, 8.5);
 }
 
 /// Where numbers would cover one another only the first of a cell is drawn.
@@ -219,7 +244,11 @@ void CFramePainter::DrawForeground(QPainter& painter, const QRectF& rect,
     DrawLines(painter, scene, m_moved, false);
     painter.setRenderHint(QPainter::Antialiasing, true);
     if (scene.lines.empty()) DrawNodes(painter);
-    if (options.hinges) DrawHinges(painter, scene);
+    m_hinges.clear();
+    if (options.hinges && picture.marks)
+        DrawMarks(painter, picture);
+    else if (options.hinges)
+        DrawHinges(painter, scene);
     if (options.nodeNumbers || options.elementNumbers) DrawNumbers(painter, area, picture, options);
     DrawTriad(painter, area, AxesOf(camera));
     painter.restore();
@@ -243,4 +272,24 @@ long CFramePainter::NodeAt(QPointF place) const
         nearest = static_cast<long>(n);
     }
     return nearest;
+}
+
+long CFramePainter::HingeAt(QPointF place) const
+{
+    long nearest = -1;
+    double distance = kHit;
+    for (auto m = m_order.rbegin(); m != m_order.rend(); ++m) {
+        if (*m >= m_hinges.size()) continue;
+        const double d = QLineF(place, m_hinges[*m]).length();
+        if (d >= distance) continue;
+        distance = d;
+        nearest = static_cast<long>(*m);
+    }
+    return nearest;
+}
+
+const T_CAMERA& CameraFor(int flatAxis)
+{
+    constexpr const T_CAMERA* kStraight[] = {&kElevationYZ, &kElevationXZ, &kPlanXY};
+    return flatAxis < 0 ? kIsometric : *kStraight[flatAxis];
 }

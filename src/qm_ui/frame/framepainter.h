@@ -1,7 +1,7 @@
 // Draws a frame with any QPainter: wireframe, supports, numbers, hinges, its displaced shape.
 #pragma once
 
-#include "qm_rps/desk/framescene.h"
+#include "qm_rps/desk/hingemarks.h"
 
 #include <QLineF>
 #include <QPointF>
@@ -25,6 +25,10 @@ inline constexpr T_CAMERA kElevationXZ{0.0, 0.0, 1.0, {}};
 inline constexpr T_CAMERA kElevationYZ{90.0, 0.0, 1.0, {}};
 inline constexpr T_CAMERA kPlanXY{0.0, 90.0, 1.0, {}};
 
+/// Looks straight on a frame in a plane with this normal axis (CFrameScene::FlatAxis); -1: from
+/// above a corner.
+const T_CAMERA& CameraFor(int flatAxis);
+
 /// What is drawn besides the lines.
 struct T_FRAME_OPTIONS {
     bool nodeNumbers = false, elementNumbers = false;
@@ -41,6 +45,7 @@ struct T_FRAME_PICTURE {
     std::string subtitle;                                             // what is shown
     std::string note;                                                 // more about it
     std::vector<T_SCENE_DRIFT> drifts;
+    const T_HINGE_MARKS* marks = nullptr; // hinges by their states; null: in one colour
 };
 
 /// Lengths are px at 96 dpi. State: buffers that are used again for the next picture.
@@ -58,6 +63,8 @@ public:
 
     /// The node of the latest picture nearest to a place, within 10 px; -1: none.
     [[nodiscard]] long NodeAt(QPointF place) const;
+    /// The hinge of its marks, likewise; of several at one place the one whose state is worst.
+    [[nodiscard]] long HingeAt(QPointF place) const;
 
 private:
     void PlaceDesign(const T_FRAME_PICTURE& picture, const T_CAMERA& camera, const QRectF& area);
@@ -67,10 +74,13 @@ private:
     void DrawNodes(QPainter& painter) const;
     void DrawSupports(QPainter& painter, const T_FRAME_SCENE& scene) const;
     void DrawHinges(QPainter& painter, const T_FRAME_SCENE& scene) const;
+    void DrawMarks(QPainter& painter, const T_FRAME_PICTURE& picture);
     void DrawNumbers(QPainter& painter, const QRectF& area, const T_FRAME_PICTURE& picture,
                      const T_FRAME_OPTIONS& options) const;
 
     std::vector<QPointF> m_design, m_moved; // nodes on the page
+    std::vector<QPointF> m_hinges;          // marks on the page
+    std::vector<std::size_t> m_order;       // of marks, the worst state last
     double m_pxPerLength = 1.0;
     std::vector<QLineF> m_lines;
 };

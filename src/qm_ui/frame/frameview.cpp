@@ -56,6 +56,7 @@ CFrameView::T_KEPT CFrameView::Key() const
             m_picture.displacement != nullptr,
             lines,
             !m_picture.drifts.empty(),
+            m_picture.marks != nullptr,
             m_camera,
             m_options,
             size()};
@@ -99,7 +100,18 @@ QString CFrameView::ReadOut(QPointF place) const
 
 void CFrameView::mousePressEvent(QMouseEvent* event)
 {
-    m_grab = event->position();
+    m_grab = m_press = event->position();
+}
+
+/// A click, where the mouse has not moved.
+void CFrameView::mouseReleaseEvent(QMouseEvent* event)
+{
+    constexpr double kStill = 3.0; // px
+    if (!m_onHinge || event->button() != Qt::LeftButton ||
+        QLineF(m_press, event->position()).length() > kStill)
+        return;
+    const long hinge = m_picture.marks ? m_painter.HingeAt(event->position()) : -1;
+    if (hinge >= 0) m_onHinge(hinge);
 }
 
 void CFrameView::Turn(double yawDeg, double pitchDeg)

@@ -7,6 +7,8 @@
 #include <QPoint>
 #include <QWidget>
 
+#include <functional>
+
 /// Left drag turns, right or middle drag (or left with Shift) moves, the wheel zooms at the cursor,
 /// a double click fits. Arrow keys turn, + and - zoom, 0 fits; 1 to 4 isometric, XZ, YZ, XY.
 class CFrameView : public QWidget {
@@ -20,6 +22,8 @@ public:
     const T_CAMERA& Camera() const { return m_camera; }
     void SetOptions(const T_FRAME_OPTIONS& options);
     const T_FRAME_OPTIONS& Options() const { return m_options; }
+    /// A hinge of the picture's marks was clicked.
+    std::function<void(long hinge)> m_onHinge;
     /// Id and coordinates of the node under a place; empty: none.
     [[nodiscard]] QString ReadOut(QPointF place) const;
 
@@ -30,6 +34,7 @@ protected:
     void paintEvent(QPaintEvent* event) override;
     void mousePressEvent(QMouseEvent* event) override;
     void mouseMoveEvent(QMouseEvent* event) override;
+    void mouseReleaseEvent(QMouseEvent* event) override;
     void mouseDoubleClickEvent(QMouseEvent* event) override;
     void wheelEvent(QWheelEvent* event) override;
     void keyPressEvent(QKeyEvent* event) override;
@@ -48,7 +53,7 @@ private:
         long revision = 0;
         bool moved = false;
         std::size_t lines = 0; // titles that are shown: they move the frame
-        bool drifts = false;
+        bool drifts = false, marks = false;
         T_CAMERA camera;
         T_FRAME_OPTIONS options;
         QSize size;
@@ -57,5 +62,5 @@ private:
     T_KEPT Key() const;
     T_KEPT m_kept;
     QPixmap m_background;
-    QPointF m_grab;
+    QPointF m_grab, m_press;
 };

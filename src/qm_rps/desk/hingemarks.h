@@ -1,0 +1,28 @@
+// The hinges of a push on the picture of the frame.
+#pragma once
+
+#include "qm_rps/desk/framescene.h"
+#include "qm_rps/push/pushrun.h"
+
+/// A hinge component at its place on the frame.
+struct T_HINGE_MARK {
+    long line = -1;       // of the scene; -1: at the node
+    std::size_t node = 0; // of a point spring
+    double at = 0.0;      // fraction of the line, from I
+    PUSH_STATE state = PUSH_STATE::Elastic;
+    bool chosen = false;
+};
+
+struct T_HINGE_MARKS {
+    std::vector<T_HINGE_MARK> hinges; // as those of the run
+    std::array<bool, kPushStateNames.size()>
+        occurs{}; // in any step, so that a legend keeps its lines
+};
+
+/// The places; all states elastic. A hinge on an element that is not in the scene has no place and
+/// stands at the first node.
+T_HINGE_MARKS PlaceHinges(const T_PUSH_RUN& run, const T_FRAME_SCENE& scene, const T_MODEL& model);
+/// The states of a step, from 1.
+void ShowStates(const T_PUSH_RUN& run, int step, long chosen, T_HINGE_MARKS& marks);
+/// "elastic", "B-IO" ... "failed" in the user's language.
+std::string PushStateText(PUSH_STATE state);

@@ -1,0 +1,56 @@
+#include "qm_rps/push/pushresultlist.h"
+
+#include "qm_base/say.h"
+#include "qm_base/textformat.h"
+
+#include <algorithm>
+#include <cmath>
+
+std::vector<T_PUSH_RESULT_ID> PushResultsOf(CDBDoc& doc)
+{
+    std::vector<T_PUSH_RESULT_ID> out;
+    const T_MODEL& model = doc.Data().Model();
+    const auto add = [&](int key, int turn, IPushResult& result) {
+        const auto record = model.pushovers.find(key);
+        if (record == model.pushovers.end() || !result.Run()) return;
+        const T_RUN_HEAD& head = result.Run()->Head();
+        out.push_back({key, turn,
+                       record->second.name +
+                           (turn > 0 ? "@" + FormatText("%g", head.angle) : std::string())});
+    };
+    for (const auto& [key, result] : doc.Data().Content().results)
+        if (result) add(key, 0, *result);
+    for (const auto& [at, result] : doc.Data().Content().turnedResults)
+        if (result) add(at.first, at.second, *result);
+    std::ranges::sort(out, {},
+                      [](const T_PUSH_RESULT_ID& id) { return std::pair(id.key, id.turn); });
+    return out;
+}
+
+int ReadOldRun(CDBDoc& doc, const T_PUSH_RESULT_ID& id, T_PUSH_RUN& out, std::string& error)
+{
+    IPushRun* const stored = doc.Post().RunOf(id.key, id.turn);
+    T_PUSH_RUN run;
+    if (!stored) {
+        error = Say("IDS_QM_PUSH_NO_RUN");
+        return 0;
+    }
+    if (!ReadWholeRun(*stored, run.data, error)) return 0;
+    run.name = id.name;
+    run.key = id.key;
+    run.turn = id.turn;
+    const T_DOF6& control = run.data.head.control;
+    const auto largest =
+        std::ranges::max_element(control, {}, [](double c) { return std::fabs(c); });
+    run.direction = static_cast<std::size_t>(largest - control.begin());
+    run.status = StatusOf(run.data.head.end.outcome);
+    run.outcome = PushOutcomeName(run.data.head.end.outcome);
+    for (const T_RUN_STEP& step : run.data.steps) {
+        run.loadFactor.push_back(step.loadFactor);
+        run.displacement.push_back(step.displacement);
+        run.baseReaction.push_back(step.baseReaction);
+        run.residual.push_back(step.residual);
+    }
+    out = std::move(run);
+    return 1;
+}

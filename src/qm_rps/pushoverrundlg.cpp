@@ -1,0 +1,191 @@
+#include "qm_rps/pushoverrundlg.h"
+
+#include "qm_base/say.h"
+#include "qm_base/textformat.h"
+#include "qm_rps/push/pushquantity.h"
+#include "qm_rps/push/pushresultlist.h"
+#include "qm_rps/push/pushworker.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace {
+
+/// While it lives, no edit changes the document, and the flag is set.
+class CRunning {
+public:
+    CRunning(CDataCtrl& data, bool& flag) : m_data(data), m_flag(flag) { Set(true); }
+    ~CRunning() { Set(false); }
+    CRunning(const CRunning&) = delete;
+    CRunning& operator=(const CRunning&) = delete;
+
+private:
+    void Set(bool on)
+    {
+        m_data.SetLocked(on);
+        m_flag = on;
+    }
+    CDataCtrl& m_data;
+    bool& m_flag;
+};
+
+} // namespace
+
+CPushOverRunDlg::CPushOverRunDlg(CDBDoc& doc) : m_doc(doc)
+{
+    for (const auto& [key, record] : doc.Data().Model().pushovers) {
+        if (!record.control) continue;
+        m_cases.push_back(key);
+        m_chosen.insert(key);
+    }
+}
+
+CPushOverRunDlg::~CPushOverRunDlg() = default;
+
+std::string CPushOverRunDlg::CaseText(std::size_t row, std::size_t column) const
+{
+    const int key = m_cases.at(row);
+    const auto record = m_doc.Data().Model().pushovers.find(key);
+    if (record == m_doc.Data().Model().pushovers.end()) return {};
+    if (column == 0) return record->second.name;
+    const auto has = [key](const T_PUSH_RESULT_ID& id) { return id.key == key; };
+    std::string why;
+    if (std::ranges::none_of(PushResultsOf(m_doc), has)) return Say("IDS_QM_UI_PUSH_RUN_NONE");
+    return Say(m_doc.Post().IsStale(key, why) ? "IDS_QM_UI_PUSH_RUN_OLD"
+                                              : "IDS_QM_UI_PUSH_RUN_CURRENT");
+}
+
+void CPushOverRunDlg::OnChoose(std::size_t row, bool chosen)
+{
+    if (m_running) return;
+    if (chosen)
+        m_chosen.insert(m_cases.at(row));
+    else
+        m_chosen.erase(m_cases.at(row));
+}
+
+std::size_t CPushOverRunDlg::Direction() const
+{
+    const auto& records = m_doc.Data().Model().pushovers;
+    const auto record = m_chosen.empty() ? records.end() : records.find(*m_chosen.begin());
+    return record == records.end() ? 0 : static_cast<std::size_t>(record->second.direction - 1);
+}
+
+bool CPushOverRunDlg::OnClose()
+{
+    if (m_running) OnCancelRun();
+    return !m_running;
+}
+
+int CPushOverRunDlg::OnRun()
+{
+    if (!CanRun()) return 0;
+    m_cancel = m_paused = false;
+    m_curves.clear();
+    m_runs.clear();
+    m_rows.clear();
+    int done = 0;
+    {
+        const CRunning running(m_doc.Data(), m_running);
+        CPushWorker worker(m_doc, {m_chosen.begin(), m_chosen.end()});
+        Watch(worker);
+        done = TakeResults(worker);
+        m_paused = false;
+    }
+    CPushRun keeper(m_doc);
+    keeper.Keep(m_runs);
+    if (m_changed) m_changed();
+    return done;
+}
+
+void CPushOverRunDlg::Watch(CPushWorker& worker)
+{
+    constexpr int kWaitMs = 20; // short enough for a window
+    std::vector<T_PUSH_PROGRESS> steps;
+    bool ended = false;
+    if (m_changed) m_changed();
+    while (!ended) {
+        steps.clear();
+        ended = worker.TakeSteps(kWaitMs, steps);
+        for (const T_PUSH_PROGRESS& step : steps) {
+            if (m_curves.empty() || m_curves.back().name != step.name)
+                m_curves.push_back({step.name, 0, 0, {}, {}});
+            T_CURVE& curve = m_curves.back();
+            curve.done = step.done;
+            curve.total = step.total;
+            curve.displacement.push_back(step.displacement);
+            curve.baseReaction.push_back(step.baseReaction);
+        }
+        if (m_changed && !steps.empty()) m_changed();
+        if (View()) View()->DispatchEvents();
+        worker.Pause(m_paused);
+        if (m_cancel) worker.Cancel();
+    }
+}
+
+int CPushOverRunDlg::TakeResults(CPushWorker& worker)
+{
+    int done = 1;
+    for (T_PUSH_DONE& one : worker.Finish()) {
+        for (T_PUSH_RUN& run : one.runs) {
+            AddRow(run);
+            m_runs.push_back(std::move(run));
+        }
+        if (one.error.empty()) continue;
+        done = 0;
+        T_ROW& row = m_rows.emplace_back();
+        row.name = m_doc.Data().Model().pushovers.at(one.key).name;
+        row.outcome = Say("IDS_QM_UI_PUSH_RUN_REFUSED");
+        row.advice = one.error;
+    }
+    return done;
+}
+
+void CPushOverRunDlg::AddRow(const T_PUSH_RUN& run)
+{
+    T_ROW row{run.name,
+              run.outcome,
+              run.advice,
+              run.status != PUSH_STATUS::Failed,
+              run.loadFactor.size(),
+              run.direction};
+    if (row.steps > 0) {
+        row.loadFactor = run.loadFactor.back();
+        row.displacement = run.displacement.back();
+        row.largestReaction =
+            *std::ranges::max_element(run.baseReaction, {}, [](double v) { return std::fabs(v); });
+    }
+    m_rows.push_back(std::move(row));
+}
+
+std::string CPushOverRunDlg::RowText(std::size_t row, std::size_t column) const
+{
+    const T_ROW& r = m_rows.at(row);
+    const auto number = [&](double si, const T_PUSH_QUANTITY& q) {
+        return FormatText("%.6g", q.Shown(si));
+    };
+    if (column == 0) return r.name;
+    if (column == 1) return r.outcome;
+    if (r.steps == 0) return column == 2 ? "0" : "";
+    if (column == 2) return std::to_string(r.steps);
+    if (column == 3) return FormatText("%.6g", r.loadFactor);
+    return column == 4 ? number(r.displacement, DisplacementIn(r.direction, Units()))
+                       : number(r.largestReaction, ReactionIn(r.direction, Units()));
+}
+
+std::string CPushOverRunDlg::StatusText() const
+{
+    if (m_running && m_curves.empty()) return Say("IDS_QM_UI_PUSH_RUN_PREPARES");
+    if (m_running) {
+        const T_CURVE& c = m_curves.back();
+        const T_PUSH_QUANTITY q = DisplacementIn(Direction(), Units());
+        return Say(m_paused ? "IDS_QM_UI_PUSH_RUN_PAUSED" : "IDS_QM_UI_PUSH_RUN_AT", c.name,
+                   std::to_string(c.done), std::to_string(c.total),
+                   FormatText("%.4g", q.Shown(c.displacement.back())) + " " + q.Unit());
+    }
+    std::string text;
+    for (const T_ROW& row : m_rows)
+        text += (text.empty() ? "" : "\n") + row.name + ": " + row.advice;
+    if (!text.empty()) return text;
+    return Say(m_cases.empty() ? "IDS_QM_CLI_PUSH_NO_CASE" : "IDS_QM_UI_PUSH_RUN_READY");
+}

@@ -1,0 +1,87 @@
+#include "qm_ui/push/stepfield.h"
+
+#include "qm_base/say.h"
+#include "qm_base/textformat.h"
+#include "qm_ui/form/localnumber.h"
+#include "qm_ui/frame/frameview.h"
+
+#include <QSignalBlocker>
+#include <QSlider>
+
+#include <algorithm>
+
+namespace {
+
+class CStepField : public CFormField {
+public:
+    CStepField(CPushOverResultDlg& shown, const ChangedFn& changed, QWidget* parent)
+        : m_shown(shown), m_slider(new QSlider(Qt::Horizontal, parent))
+    {
+        widget = m_slider;
+        m_slider->setMinimum(1);
+        m_slider->setMinimumWidth(320);
+        QObject::connect(m_slider, &QSlider::valueChanged, [this, changed](int step) {
+            m_shown.OnStep(step);
+            changed();
+        });
+    }
+    void Show() override
+    {
+        const QSignalBlocker quiet(m_slider);
+        m_slider->setMaximum(std::max(m_shown.Steps(), 1));
+        m_slider->setValue(m_shown.Step());
+        m_slider->setEnabled(m_shown.Steps() > 1);
+    }
+
+private:
+    CPushOverResultDlg& m_shown;
+    QSlider* m_slider;
+};
+
+class CStateFrame : public CFormField {
+public:
+    CStateFrame(CPushOverHingeStateDlg& shown, const ChangedFn& changed, QWidget* parent)
+        : m_shown(shown), m_view(new CFrameView(parent))
+    {
+        widget = m_view;
+        m_view->SetCamera(CameraFor(CFrameScene::FlatAxis(shown.Scene())));
+        m_view->m_onHinge = [this, changed](long hinge) {
+            m_shown.OnHinge(hinge);
+            changed();
+        };
+    }
+    void Show() override
+    {
+        T_FRAME_PICTURE picture;
+        picture.scene = &m_shown.Scene();
+        picture.subtitle = m_shown.TitleText();
+        if (m_shown.Step() > 0) {
+            picture.subtitle += ", " + Say("IDS_QM_PLOT_PUSH_STEP", std::to_string(m_shown.Step()));
+            picture.note = Say("IDS_QM_UI_SHAPE_NOTE",
+                               LocalNumberText(ShortestText(m_shown.Scale())).toStdString(),
+                               picture.scene->lengthUnit);
+            picture.displacement = &m_shown.Moves();
+            picture.scale = m_shown.Scale();
+            if (!m_shown.Marks().hinges.empty()) picture.marks = &m_shown.Marks();
+        }
+        m_view->SetPicture(std::move(picture));
+    }
+
+private:
+    CPushOverHingeStateDlg& m_shown;
+    CFrameView* m_view;
+};
+
+} // namespace
+
+std::unique_ptr<CFormField> MakeStepField(CPushOverResultDlg& shown, ChangedFn changed,
+                                          QWidget* parent)
+{
+    return std::make_unique<CStepField>(shown, changed, parent);
+}
+
+std::unique_ptr<CFormField> MakeStateFrame(CPushOverHingeStateDlg& shown, ChangedFn changed,
+                                           QWidget* parent)
+{
+    return std::make_unique<CStateFrame>(shown, changed, parent);
+}
