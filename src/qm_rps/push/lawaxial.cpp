@@ -137,11 +137,8 @@ int FromUser(const T_AXIAL_BASIS& b, std::vector<solver::T_AXIAL_STRENGTH>& out,
     }
     const std::size_t axis = b.component == HINGE_COMPONENT::My ? 0 : 1;
     const T_PMM_CURVES& negative = pmm->negative ? *pmm->negative : pmm->curves;
-    const T_SIDES<T_LINE> lines{LineOf(pmm->curves[axis], pmm->Pmax),
-                                LineOf(negative[axis], pmm->Pmax)};
-    if (IsAutoYield(b.curve)) return FromShape(b, lines, out, reason);
-    Join(lines, b.yield, out);
-    return 1;
+    return FromShape(b, {LineOf(pmm->curves[axis], pmm->Pmax), LineOf(negative[axis], pmm->Pmax)},
+                     out, reason);
 }
 
 /// Entered strengths of curves by axial force (compression positive).

@@ -27,9 +27,9 @@ struct T_AXIAL_BASIS {
 /// Yield strengths by axial force, tension positive, ascending; empty: the axial force does not
 /// count. Curves by axial force: their entered strengths, beyond the list those of its ends. Else
 /// by the interaction of the component. PMM: the moments of the type's yield surface; where it has
-/// none, section and material of the element give the shape, and the yield strength is that at no
-/// axial force. User: M / Mmax of the type's curves times the entered yield strength, which is
-/// Mmax; an automatic one is that at no axial force. Curves by axial force with automatic strengths
+/// none, section and material of the element. User: the P-M curves of the type. Section and user
+/// curves give the shape alone: the yield strength of the hinge is that at no axial force (MY0), so
+/// it may be below the largest one. Curves by axial force with automatic strengths
 /// follow section and material.
 /// 1 done; 0 with the reason: there is no curve, or it does not reach a force of 0.
 [[nodiscard]] int StrengthsByAxial(const T_AXIAL_BASIS& basis,

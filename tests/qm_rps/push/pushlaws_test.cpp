@@ -113,7 +113,7 @@ TEST(PushLaws, AutomaticStrengthsComeFromTheGeneratedHinge)
     EXPECT_NE(std::string::npos, error.find("--type \"T\" --elements 1")) << error;
 }
 
-// Pmax 1000; the entered strengths are Mmax of the two sides. (+) is half of its largest at 500 of
+// Pmax 1000; the entered strengths hold at no axial force. (+) is half of its largest at 500 of
 // compression and at 250 of tension; (-) falls to nothing at 250 of compression.
 TEST(PushLaws, InteractionGivesStrengthsByAxialForce)
 {
