@@ -9,7 +9,7 @@
 #include "json/pushjson.h"
 
 #ifdef QM_UI
-#include "qm_ui/plot/plotdata.h"
+#include "qm_ui/push/pushcurveplot.h"
 #endif
 
 #include <algorithm>
@@ -69,30 +69,6 @@ EXIT_CODE PrintTables(const T_PUSH_OPTIONS& o, const std::vector<T_PUSH_RUN>& ru
     return EXIT_CODE::Done;
 }
 
-#ifdef QM_UI
-/// Base reaction over displacement, one curve for each run.
-T_PLOT CurvePlot(const std::vector<T_PUSH_RUN>& runs, const T_UNITS& units,
-                 const std::string& title)
-{
-    T_PLOT plot;
-    const bool turns = !runs.empty() && runs.front().direction > 2;
-    const std::string force(NameOf(units.force)), length(NameOf(units.length));
-    plot.title = title;
-    plot.x.title = Say("IDS_QM_CLI_PUSH_DISPLACEMENT") + " (" + (turns ? "rad" : length) + ")";
-    plot.y.title =
-        Say("IDS_QM_CLI_PUSH_REACTION") + " (" + (turns ? force + "*" + length : force) + ")";
-    for (const T_PUSH_RUN& run : runs) {
-        T_PLOT_SERIES& s = plot.series.emplace_back();
-        s.name = run.name;
-        for (std::size_t i = 0; i < run.loadFactor.size(); ++i) {
-            s.x.push_back(FromSi(run.displacement[i], units, turns ? kDimNone : kDimLength));
-            s.y.push_back(FromSi(run.baseReaction[i], units, turns ? kDimMoment : kDimForce));
-        }
-    }
-    return plot;
-}
-#endif
-
 /// A model file keeps the results; -o writes another file.
 EXIT_CODE Store(CDBDoc& doc, const T_PUSH_OPTIONS& o)
 {
@@ -131,7 +107,7 @@ EXIT_CODE RunPush(const T_PUSH_OPTIONS& o)
     if (!o.json.empty()) code = WriteOutput(o.json, PushJson(runs, nodes, units));
 #ifdef QM_UI
     if (code == EXIT_CODE::Done && !o.plot.empty())
-        code = WritePicture(CurvePlot(runs, units, doc.Data().Model().styp.title), o.plot);
+        code = WritePicture(PushCurvePlot(runs, units, doc.Data().Model().styp.title), o.plot);
 #endif
     if (code == EXIT_CODE::Done) code = Store(doc, o);
     if (code != EXIT_CODE::Done) return code;

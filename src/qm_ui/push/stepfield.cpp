@@ -14,61 +14,62 @@ namespace {
 
 class CStepField : public CFormField {
 public:
-    CStepField(CPushOverResultDlg& shown, const ChangedFn& changed, QWidget* parent)
-        : m_shown(shown), m_slider(new QSlider(Qt::Horizontal, parent))
+    CStepField(CPushOverResultDlg& results, const ChangedFn& changed, QWidget* parent)
+        : m_results(results), m_slider(new QSlider(Qt::Horizontal, parent))
     {
         widget = m_slider;
         m_slider->setMinimum(1);
         m_slider->setMinimumWidth(320);
         QObject::connect(m_slider, &QSlider::valueChanged, [this, changed](int step) {
-            m_shown.OnStep(step);
+            m_results.OnStep(step);
             changed();
         });
     }
     void Show() override
     {
         const QSignalBlocker quiet(m_slider);
-        m_slider->setMaximum(std::max(m_shown.Steps(), 1));
-        m_slider->setValue(m_shown.Step());
-        m_slider->setEnabled(m_shown.Steps() > 1);
+        m_slider->setMaximum(std::max(m_results.Steps(), 1));
+        m_slider->setValue(m_results.Step());
+        m_slider->setEnabled(m_results.Steps() > 1);
     }
 
 private:
-    CPushOverResultDlg& m_shown;
+    CPushOverResultDlg& m_results;
     QSlider* m_slider;
 };
 
 class CStateFrame : public CFormField {
 public:
-    CStateFrame(CPushOverHingeStateDlg& shown, const ChangedFn& changed, QWidget* parent)
-        : m_shown(shown), m_view(new CFrameView(parent))
+    CStateFrame(CPushOverHingeStateDlg& results, const ChangedFn& changed, QWidget* parent)
+        : m_results(results), m_view(new CFrameView(parent))
     {
         widget = m_view;
-        m_view->SetCamera(CameraFor(CFrameScene::FlatAxis(shown.Scene())));
+        m_view->SetCamera(CameraFor(CFrameScene::FlatAxis(results.Scene())));
         m_view->m_onHinge = [this, changed](long hinge) {
-            m_shown.OnHinge(hinge);
+            m_results.OnHinge(hinge);
             changed();
         };
     }
     void Show() override
     {
         T_FRAME_PICTURE picture;
-        picture.scene = &m_shown.Scene();
-        picture.subtitle = m_shown.TitleText();
-        if (m_shown.Step() > 0) {
-            picture.subtitle += ", " + Say("IDS_QM_PLOT_PUSH_STEP", std::to_string(m_shown.Step()));
+        picture.scene = &m_results.Scene();
+        picture.subtitle = m_results.TitleText();
+        if (m_results.Step() > 0) {
+            picture.subtitle +=
+                ", " + Say("IDS_QM_PLOT_PUSH_STEP", std::to_string(m_results.Step()));
             picture.note = Say("IDS_QM_UI_SHAPE_NOTE",
-                               LocalNumberText(ShortestText(m_shown.Scale())).toStdString(),
+                               LocalNumberText(ShortestText(m_results.Scale())).toStdString(),
                                picture.scene->lengthUnit);
-            picture.displacement = &m_shown.Moves();
-            picture.scale = m_shown.Scale();
-            if (!m_shown.Marks().hinges.empty()) picture.marks = &m_shown.Marks();
+            picture.displacement = &m_results.Moves();
+            picture.scale = m_results.Scale();
+            if (!m_results.Marks().hinges.empty()) picture.marks = &m_results.Marks();
         }
         m_view->SetPicture(std::move(picture));
     }
 
 private:
-    CPushOverHingeStateDlg& m_shown;
+    CPushOverHingeStateDlg& m_results;
     CFrameView* m_view;
 };
 
