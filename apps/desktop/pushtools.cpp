@@ -87,7 +87,7 @@ std::vector<T_WINDOW_EXAMPLE> PushWindowExamples()
                 "push-states", kFrame,
                 [](CDBDoc& doc) { return Pushed<CPushOverHingeStateDlg>(doc, 0.8); }),
             Example<CPushOverHingeStateDlg>(
-                "push-states-space", "rc-space-frame-3-storey",
+                "push-states-space", "eccentric-building",
                 [](CDBDoc& doc) { return Pushed<CPushOverHingeStateDlg>(doc, 1.0); }),
             Example<CPushOverStoreyDlg>("push-storeys", "steel-frame-2-storey", [](CDBDoc& doc) {
                 return Pushed<CPushOverStoreyDlg>(doc, 0.6);

@@ -80,6 +80,28 @@ void AddEvents(T_PLOT& plot, std::span<const T_PUSH_RUN> runs, const T_UNITS& un
     }
 }
 
+/// The path through its vertices, the events: it turns back where a hinge loses strength faster
+/// than the steps follow.
+T_PLOT_SERIES VertexPath(const T_PUSH_RUN& run, const T_UNITS& units)
+{
+    std::vector<double> displacement, reaction;
+    for (const T_PUSH_EVENT_ROW& event : run.events) {
+        if (event.initial) continue;
+        displacement.push_back(event.displacement);
+        reaction.push_back(event.baseReaction);
+    }
+    if (!displacement.empty() && !run.displacement.empty()) {
+        displacement.push_back(run.displacement.back());
+        reaction.push_back(run.baseReaction.back());
+    }
+    T_PLOT_SERIES s = Curve({}, run.direction, units, displacement, reaction);
+    s.line = PLOT_LINE::Solid;
+    s.width = 0.9;
+    s.color = T_PLOT_COLOR{150, 150, 150};
+    s.marker = PLOT_MARKER::None;
+    return s;
+}
+
 /// The first hinge that reaches B while the case is pushed.
 void NameFirst(T_PLOT& plot, const T_PUSH_RUN& run, const T_UNITS& units)
 {
@@ -102,6 +124,12 @@ T_PLOT PushCurvePlot(std::span<const T_PUSH_RUN> runs, const T_UNITS& units,
                      const std::string& title)
 {
     T_PLOT plot = EmptyPlot(title, runs.empty() ? 0 : runs.front().direction, units);
+    for (const T_PUSH_RUN& run : runs) {
+        T_PLOT_SERIES path = VertexPath(run, units);
+        if (path.x.empty()) continue;
+        if (plot.series.empty()) path.name = Say("IDS_QM_PLOT_PUSH_PATH");
+        plot.series.push_back(std::move(path));
+    }
     for (const T_PUSH_RUN& run : runs)
         plot.series.push_back(
             Curve(run.name, run.direction, units, run.displacement, run.baseReaction));
@@ -129,7 +157,6 @@ T_PLOT StepCurvePlot(const CPushOverResultDlg& shown)
     const T_PUSH_RUN& run = shown.Run();
     if (shown.Step() < 1) return {};
     T_PLOT plot = PushCurvePlot({&run, 1}, shown.Units(), shown.TitleText());
-    plot.subtitle = shown.StepText();
     const auto i = static_cast<std::size_t>(shown.Step() - 1);
     const double x = DisplacementIn(run.direction, shown.Units()).Shown(run.displacement[i]);
     const double y = ReactionIn(run.direction, shown.Units()).Shown(run.baseReaction[i]);

@@ -11,6 +11,8 @@ namespace {
 using STATES = CPushOverHingeStateDlg;
 using STOREYS = CPushOverStoreyDlg;
 
+constexpr QSize kSidePicture{460, 320}, kStoreyPicture{340, 400};
+
 /// Result and step, and what they are.
 void AddHead(CFormView& form, CPushOverResultDlg& shown)
 {
@@ -53,7 +55,7 @@ void BuildStates(CFormView& form, STATES& d)
     form.Columns();
     CFormField& frame = form.Custom({}, MakeStateFrame(d, form.Changed(), form.Host()));
     frame.name = "frame";
-    frame.widget->setMinimumSize(480, 300);
+    frame.widget->setMinimumSize(480, 360);
     form.Flag(KeyText("IDS_QM_UI_PUSH_HINGE_YIELDED"), {[&d] { return d.m_onlyYielded; },
                                                         [&d](const bool& only) {
                                                             d.m_onlyYielded = only;
@@ -65,13 +67,14 @@ void BuildStates(CFormView& form, STATES& d)
     grid.widget->setMinimumSize(480, 180);
     form.Note([&d] { return d.UnitsText(); });
     form.NextColumn(1);
-    form.Picture([&d] { return StepCurvePlot(d); }).widget->setMinimumSize(460, 300);
-    form.Picture([&d] {
-            return d.Hinge() < 0 ? T_PLOT()
-                                 : HingeLawPlot(d.Run(), static_cast<std::size_t>(d.Hinge()),
-                                                d.Step(), d.Units());
-        })
-        .widget->setMinimumSize(460, 300);
+    AddPlot(
+        form, [&d] { return StepCurvePlot(d); }, kSidePicture);
+    const auto law = [&d] {
+        return d.Hinge() < 0 ? T_PLOT()
+                             : HingeLawPlot(d.Run(), static_cast<std::size_t>(d.Hinge()), d.Step(),
+                                            d.Units());
+    };
+    AddPlot(form, law, kSidePicture);
     form.EndColumns();
 }
 
@@ -85,7 +88,8 @@ void BuildStoreys(CFormView& form, STOREYS& d)
     for (const auto value :
          {STOREY_VALUE::Displacement, STOREY_VALUE::Drift, STOREY_VALUE::Shear}) {
         if (value != STOREY_VALUE::Displacement) form.NextColumn(1);
-        form.Picture([&d, value] { return StoreyPlot(d, value); }).widget->setMinimumSize(330, 380);
+        AddPlot(
+            form, [&d, value] { return StoreyPlot(d, value); }, kStoreyPicture);
     }
     form.EndColumns();
     CFormField& grid = form.Grid(GridOf([&d] { return d.Table(); }));

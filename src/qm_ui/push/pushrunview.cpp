@@ -5,6 +5,7 @@
 #include "qm_rps/pushoverstoreydlg.h"
 #include "qm_ui/push/pushcurveplot.h"
 #include "qm_ui/push/pushresultviews.h"
+#include "qm_ui/push/stepfield.h"
 
 namespace {
 
@@ -101,7 +102,7 @@ void BuildRun(CFormView& form, RUN& run)
     cases.name = "cases";
     cases.widget->setMinimumSize(330, 300);
     form.NextColumn(1);
-    form.Picture([&run] { return GrowingCurvePlot(run); }).widget->setMinimumSize(560, 400);
+    AddPlot(form, [&run] { return GrowingCurvePlot(run); }, {640, 440});
     form.EndColumns();
     CFormField& rows = form.Grid(RowGrid(run));
     rows.name = "rows";

@@ -4,6 +4,7 @@
 #include "qm_base/textformat.h"
 #include "qm_ui/form/localnumber.h"
 #include "qm_ui/frame/frameview.h"
+#include "qm_ui/plot/plotwidget.h"
 
 #include <QSignalBlocker>
 #include <QSlider>
@@ -74,6 +75,13 @@ private:
 };
 
 } // namespace
+
+CFormField& AddPlot(CFormView& form, std::function<T_PLOT()> plot, QSize wanted)
+{
+    CFormField& field = form.Picture(std::move(plot));
+    if (auto* view = dynamic_cast<CPlotWidget*>(field.widget)) view->SetSizeHint(wanted);
+    return field;
+}
 
 std::unique_ptr<CFormField> MakeStepField(CPushOverResultDlg& shown, ChangedFn changed,
                                           QWidget* parent)

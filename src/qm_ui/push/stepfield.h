@@ -2,12 +2,12 @@
 #pragma once
 
 #include "qm_rps/pushoverhingestatedlg.h"
-#include "qm_ui/form/formfield.h"
+#include "qm_ui/form/formview.h"
 
 #include <memory>
 
-class QWidget;
-
+/// Adds a picture of this wanted size, which takes the room that there is.
+CFormField& AddPlot(CFormView& form, std::function<T_PLOT()> plot, QSize wanted);
 /// A slider over the steps of the shown result.
 std::unique_ptr<CFormField> MakeStepField(CPushOverResultDlg& shown, ChangedFn changed,
                                           QWidget* parent);

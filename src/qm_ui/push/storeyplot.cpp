@@ -3,6 +3,8 @@
 #include "qm_base/say.h"
 #include "qm_rps/push/pushquantity.h"
 
+#include <algorithm>
+
 namespace {
 
 struct T_LOOK {
@@ -38,6 +40,19 @@ T_PLOT_SERIES OverHeight(const std::vector<T_PUSH_STOREY_SERIES>& storeys, STORE
     return s;
 }
 
+/// From 0 on, so that lengths along the axis can be compared.
+T_PLOT_RANGE FromZero(const std::vector<T_PLOT_SERIES>& series)
+{
+    constexpr double kRoom = 1.1;
+    T_PLOT_RANGE range{0.0, 0.0};
+    for (const T_PLOT_SERIES& s : series)
+        for (const double x : s.x) {
+            range.lo = std::min(range.lo, kRoom * x);
+            range.hi = std::max(range.hi, kRoom * x);
+        }
+    return range;
+}
+
 } // namespace
 
 T_PLOT StoreyPlot(const CPushOverStoreyDlg& shown, STOREY_VALUE value)
@@ -58,11 +73,13 @@ T_PLOT StoreyPlot(const CPushOverStoreyDlg& shown, STOREY_VALUE value)
     now.line = PLOT_LINE::Solid;
     now.width = 2.4;
     plot.series.push_back(std::move(now));
-    if (!shown.m_envelope) return plot;
+    // The axis stays as the slider moves.
     T_PLOT_SERIES most = OverHeight(storeys, value, shown.Units(), Envelope);
     most.name = Say("IDS_QM_PLOT_STOREY_LARGEST");
     most.color = T_PLOT_COLOR{190, 90, 20};
     most.line = PLOT_LINE::Dash;
     plot.series.push_back(std::move(most));
+    plot.x.range = FromZero(plot.series);
+    if (!shown.m_envelope) plot.series.pop_back();
     return plot;
 }
