@@ -1,5 +1,7 @@
 #include "qm_rps/desk/framescene.h"
 
+#include "qm_base/say.h"
+
 #include <algorithm>
 #include <cmath>
 #include <limits>
@@ -122,8 +124,13 @@ std::vector<T_SHAPE_SOURCE> CFrameScene::Sources()
         for (const auto& [key, stage] : model.stages)
             sources.push_back({S::KIND::Stage, key, stage.name, stage.steps});
     for (const auto& [key, push] : model.pushovers)
-        if (post.SelectPushover(key))
-            sources.push_back({S::KIND::Pushover, key, push.name, post.GetStepCount()});
+        if (post.SelectPushover(key)) {
+            std::string why;
+            sources.push_back(
+                {S::KIND::Pushover, key,
+                 post.IsStale(key, why) ? Say("IDS_QM_UI_PUSH_OLD_NAME", push.name) : push.name,
+                 post.GetStepCount()});
+        }
     for (const auto& entry : model.modes)
         sources.push_back({S::KIND::Mode, entry.first, std::to_string(entry.first), 0});
     return sources;

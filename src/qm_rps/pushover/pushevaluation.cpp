@@ -5,6 +5,11 @@
 #include <algorithm>
 #include <cmath>
 
+bool T_PUSH_EVALUATION::IsOld() const
+{
+    return std::ranges::any_of(messages, [](const auto& m) { return m.key == kResultsAreOld; });
+}
+
 int T_PUSH_EVALUATION::Status() const
 {
     constexpr int kBeyond = 3;

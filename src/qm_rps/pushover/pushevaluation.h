@@ -80,6 +80,9 @@ struct T_PLOTTED_CURVE {
     std::vector<T_MONITORED_NODE> monitored{}; // further nodes, as the evaluation names them
 };
 
+/// Key of the message that the results of the push are older than the model.
+inline constexpr const char* kResultsAreOld = "IDS_QM_DB_PUSH_OLD";
+
 /// Ductilities of T_PUSH_EVALUATION::teffs; 1 stands for T0.
 inline constexpr std::array<double, 5> kTeffDuctilities{1.0, 2.0, 4.0, 6.0, 8.0};
 
@@ -122,6 +125,8 @@ struct T_PUSH_EVALUATION {
     /// 0 not found, 1 found, 2 elastic, 3 beyond the push: each demand is larger than the curve's
     /// largest displacement, so that nothing on the curve belongs to it.
     int Status() const;
+    /// The results of the push are older than the model: every picture and table says so.
+    bool IsOld() const;
     bool IsTarget() const { return eval.method >= PUSH_METHOD::Ec8Opcm; }
     bool IsMasonry() const
     {

@@ -103,6 +103,11 @@ void CFrameView::mousePressEvent(QMouseEvent* event)
     m_grab = m_press = event->position();
 }
 
+long CFrameView::HingeAt(QPointF place) const
+{
+    return m_picture.marks ? m_painter.HingeAt(place) : -1;
+}
+
 /// A click, where the mouse has not moved.
 void CFrameView::mouseReleaseEvent(QMouseEvent* event)
 {
@@ -110,7 +115,7 @@ void CFrameView::mouseReleaseEvent(QMouseEvent* event)
     if (!m_onHinge || event->button() != Qt::LeftButton ||
         QLineF(m_press, event->position()).length() > kStill)
         return;
-    const long hinge = m_picture.marks ? m_painter.HingeAt(event->position()) : -1;
+    const long hinge = HingeAt(event->position());
     if (hinge >= 0) m_onHinge(hinge);
 }
 

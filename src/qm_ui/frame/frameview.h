@@ -24,6 +24,8 @@ public:
     const T_FRAME_OPTIONS& Options() const { return m_options; }
     /// A hinge of the picture's marks was clicked.
     std::function<void(long hinge)> m_onHinge;
+    /// The hinge of the picture's marks at a place, as it was drawn last; -1: none.
+    [[nodiscard]] long HingeAt(QPointF place) const;
     /// Id and coordinates of the node under a place; empty: none.
     [[nodiscard]] QString ReadOut(QPointF place) const;
 

@@ -124,15 +124,15 @@ T_PLOT PushCurvePlot(std::span<const T_PUSH_RUN> runs, const T_UNITS& units,
                      const std::string& title)
 {
     T_PLOT plot = EmptyPlot(title, runs.empty() ? 0 : runs.front().direction, units);
-    for (const T_PUSH_RUN& run : runs) {
-        T_PLOT_SERIES path = VertexPath(run, units);
-        if (path.x.empty()) continue;
-        if (plot.series.empty()) path.name = Say("IDS_QM_PLOT_PUSH_PATH");
-        plot.series.push_back(std::move(path));
-    }
     for (const T_PUSH_RUN& run : runs)
         plot.series.push_back(
             Curve(run.name, run.direction, units, run.displacement, run.baseReaction));
+    for (const T_PUSH_RUN& run : runs) {
+        T_PLOT_SERIES path = VertexPath(run, units);
+        if (path.x.empty()) continue;
+        if (plot.series.size() == runs.size()) path.name = Say("IDS_QM_PLOT_PUSH_PATH");
+        plot.series.push_back(std::move(path));
+    }
     AddEvents(plot, runs, units);
     if (runs.size() <= kMostNamed)
         for (const T_PUSH_RUN& run : runs)

@@ -12,6 +12,7 @@ using STATES = CPushOverHingeStateDlg;
 using STOREYS = CPushOverStoreyDlg;
 
 constexpr QSize kSidePicture{460, 320}, kStoreyPicture{340, 400};
+constexpr int kMostTable = 240; // px: pictures take the room that is left
 
 /// Result and step, and what they are.
 void AddHead(CFormView& form, CPushOverResultDlg& shown)
@@ -65,6 +66,7 @@ void BuildStates(CFormView& form, STATES& d)
     CFormField& grid = form.Grid(HingeGrid(d));
     grid.name = "hinges";
     grid.widget->setMinimumSize(480, 180);
+    grid.widget->setMaximumHeight(kMostTable);
     form.Note([&d] { return d.UnitsText(); });
     form.NextColumn(1);
     AddPlot(
@@ -95,6 +97,7 @@ void BuildStoreys(CFormView& form, STOREYS& d)
     CFormField& grid = form.Grid(GridOf([&d] { return d.Table(); }));
     grid.name = "storeys";
     grid.widget->setMinimumHeight(140);
+    grid.widget->setMaximumHeight(kMostTable);
 }
 
 } // namespace

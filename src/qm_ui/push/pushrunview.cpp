@@ -107,6 +107,7 @@ void BuildRun(CFormView& form, RUN& run)
     CFormField& rows = form.Grid(RowGrid(run));
     rows.name = "rows";
     rows.widget->setMinimumHeight(130);
+    rows.widget->setMaximumHeight(220);
 }
 
 } // namespace

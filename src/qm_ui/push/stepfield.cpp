@@ -39,10 +39,17 @@ private:
     QSlider* m_slider;
 };
 
+/// Shares its column with a table.
+class CStateView : public CFrameView {
+public:
+    using CFrameView::CFrameView;
+    QSize sizeHint() const override { return {560, 400}; }
+};
+
 class CStateFrame : public CFormField {
 public:
     CStateFrame(CPushOverHingeStateDlg& results, const ChangedFn& changed, QWidget* parent)
-        : m_results(results), m_view(new CFrameView(parent))
+        : m_results(results), m_view(new CStateView(parent))
     {
         widget = m_view;
         m_view->SetCamera(CameraFor(CFrameScene::FlatAxis(results.Scene())));

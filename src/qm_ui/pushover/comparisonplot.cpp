@@ -52,7 +52,7 @@ T_PLOT ComparisonPlot(const T_PUSH_COMPARISON& c)
     if (c.results.empty()) return plot;
     const T_PUSH_EVALUATION& first = c.results.front();
     const std::string unit(NameOf(first.units.length));
-    plot.title = MMSGFunction::Format("IDS_QM_UI_PLOT_ALL_METHODS", {first.eval.push});
+    plot.title = MMSGFunction::Format("IDS_QM_UI_PLOT_ALL_METHODS", {ShownPushName(first)});
     plot.subtitle = MMSGFunction::Format("IDS_QM_UI_PLOT_ALL_SUBTITLE", {first.eval.spectrum});
     plot.x.title = MMSGFunction::GetValue("IDS_PUSHOVER_Spectral_Displ_") + " (" + unit + ")";
     plot.y.title = MMSGFunction::GetValue("IDS_PUSHOVER_Spectral_Accel__g_");

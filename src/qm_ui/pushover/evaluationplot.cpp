@@ -179,13 +179,19 @@ std::string PlotStepText(int step)
     return MMSGFunction::Format("IDS_QM_UI_PLOT_STEP", {std::to_string(step)});
 }
 
+std::string ShownPushName(const T_PUSH_EVALUATION& e)
+{
+    return e.IsOld() ? MMSGFunction::Format("IDS_QM_UI_PUSH_OLD_NAME", {e.eval.push}) : e.eval.push;
+}
+
 std::string PlotSubtitle(const T_PUSH_EVALUATION& e)
 {
     std::string method = MethodName(e.eval.method);
     if (!e.IsTarget())
         method +=
             " " + MMSGFunction::Format("IDS_QM_UI_PLOT_PROCEDURE", {std::string(1, e.procedure)});
-    return MMSGFunction::Format("IDS_QM_UI_PLOT_SUBTITLE", {method, e.eval.push, e.eval.spectrum});
+    return MMSGFunction::Format("IDS_QM_UI_PLOT_SUBTITLE",
+                                {method, ShownPushName(e), e.eval.spectrum});
 }
 
 void AddEvaluationNotes(T_PLOT& plot, const T_PUSH_EVALUATION& e)

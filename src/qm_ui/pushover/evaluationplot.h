@@ -13,6 +13,8 @@ T_PLOT DemandPlot(const T_PUSH_EVALUATION& e);
 
 // Parts that other pictures of an evaluation share.
 std::string PlotStepText(int step);
+/// The load case; "PX (out of date)" where its results are older than the model.
+std::string ShownPushName(const T_PUSH_EVALUATION& e);
 std::string PlotSubtitle(const T_PUSH_EVALUATION& e);
 /// Displacements of the further nodes, against the forces of the plotted curve.
 void AddMonitoredNodes(T_PLOT& plot, const T_PUSH_EVALUATION& e);

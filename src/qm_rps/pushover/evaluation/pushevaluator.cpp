@@ -142,6 +142,8 @@ int CPushEvaluator::IsUsable()
 
 void CPushEvaluator::WarnAboutCurve()
 {
+    if (std::string why; m_doc.Post().IsStale(m_pushover, why))
+        m_result.messages.push_back({kResultsAreOld, why});
     if (m_curve.StoreyWithoutMass()) Say("IDS_RPS_ERROR_DIAPHRAGM_MASS");
     if (const int step = m_curve.FirstDecreasingStep())
         Say("IDS_QM_WARN_DECREASING_DISPLACEMENT", {m_eval.push, std::to_string(step)});
