@@ -3,6 +3,7 @@
 #include "qm_base/say.h"
 #include "qm_db/recordfacts.h"
 #include "qm_rps/push/loadalgebra.h"
+#include "qm_rps/push/pushrun.h"
 #include "qm_rps/push/pushstoreys.h"
 #include "qm_solver/framesolver.h"
 
@@ -201,8 +202,9 @@ private:
     int ComputeModes(std::string& error)
     {
         constexpr std::size_t kCount = 12;
-        if (!m_modes.empty()) return 1;
-        solver::CFrameSolver solver;
+        std::string why;
+        if (!m_modes.empty() || CPushRun(m_doc).Modes(kCount, m_modes, why)) return 1;
+        solver::CFrameSolver solver; // hinges that can't be pushed yet: the elastic frame
         solver::T_SOLVER_ERROR fault;
         if (solver.Prepare(m_frame.Frame(), fault) && solver.Modes(kCount, m_modes, fault))
             return 1;

@@ -37,10 +37,10 @@ std::vector<std::string> CaseNames(const T_CASE_CHOICE& choice);
 
 /// The cases in the order of their names, in current units; loads and sign of the target point the
 /// same way. Control node: of the top storey the node nearest to its centre of mass, without
-/// storeys the highest one. Modes are those of the model, where it has any, else of the elastic
-/// frame. 1 done; 0 `error` says why (nothing chosen, a name that exists, no mass, no mode, a
-/// control node that is not there or restrained, a target or an eccentricity out of range); `out`
-/// and `basis` unchanged.
+/// storeys the highest one. Modes are those of the model, where it has any, else computed as the
+/// push does (of the elastic frame where its hinges can't be pushed yet). 1 done; 0 `error` says
+/// why (nothing chosen, a name that exists, no mass, no mode, a control node that is not there or
+/// restrained, a target or an eccentricity out of range); `out` and `basis` unchanged.
 [[nodiscard]] int GenerateCases(CDBDoc& doc, const T_CASE_CHOICE& choice,
                                 std::vector<T_POLC_D>& out, T_CASE_BASIS& basis,
                                 std::string& error);

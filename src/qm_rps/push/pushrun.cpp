@@ -90,6 +90,17 @@ int CPushRun::Prepare(const T_PUSH_BASIS& basis, T_PREPARED*& out, std::string& 
     return 1;
 }
 
+int CPushRun::Modes(std::size_t count, std::vector<solver::T_MODE>& out, std::string& error)
+{
+    const T_POGC_D& control = m_model.pushControl;
+    T_PREPARED* on = nullptr;
+    if (!BuildFrame(error) || !Prepare({control.initialLoads, control.pDelta}, on, error)) return 0;
+    solver::T_SOLVER_ERROR fault;
+    if (on->solver.Modes(count, out, fault)) return 1;
+    error = Words(fault);
+    return 0;
+}
+
 std::vector<solver::T_VEC6> CPushRun::ModeShape(T_PREPARED& on, int mode, const T_POLC_D& record,
                                                 std::string& error)
 {

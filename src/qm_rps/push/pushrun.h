@@ -80,6 +80,11 @@ public:
     /// of our own, they can't be read, or they are older than the model), `out` unchanged.
     [[nodiscard]] int Read(int key, int turn, T_PUSH_RUN& out, std::string& error);
 
+    /// The lowest modes of the frame with the springs of its hinges, as load patterns take those
+    /// that the model does not hold. 1 done; 0 `error` says what is wrong with model or hinges.
+    [[nodiscard]] int Modes(std::size_t count, std::vector<solver::T_MODE>& out,
+                            std::string& error);
+
     /// Puts the results of a load case, as Run gives them, in place of those that the document has.
     void Keep(std::vector<T_PUSH_RUN>& runs);
 
