@@ -3,6 +3,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_ui/pushover/adrscurve.h"
+#include "qm_ui/pushover/evaluationplot.h"
 
 #include <algorithm>
 #include <vector>
