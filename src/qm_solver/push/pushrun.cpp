@@ -279,11 +279,16 @@ CPushRun::T_FAULT CPushRun::Follow(const T_PUSH_STAGE& stage, int number, T_PUSH
             return finish(end.outcome);
         }
         T_PUSH_END stop;
+        const bool isBehind = IsBehind(stage);
         const double toEvent = m_path->NextEvent(), toTarget = ToTarget(stage),
-                     toStop = number < 0 ? CHingeBackbone::kFar : ToStop(stage, stop);
-        const double by = std::min({toEvent, toTarget, toStop});
+                     toStop = number < 0 || isBehind ? CHingeBackbone::kFar : ToStop(stage, stop),
+                     toReturn = isBehind ? ToReturn(stage) : CHingeBackbone::kFar;
+        const double by = std::min({toEvent, toTarget, toStop, toReturn});
         if (!(by < CHingeBackbone::kFar)) return finish(PUSH_OUTCOME::NoPath);
         m_path->Advance(by);
+        if (!isBehind) m_peak.reaction = std::max(m_peak.reaction, m_sign * Reaction(stage));
+        if (!byLoad && m_sign * (Present(stage) - m_far) > 0.0) m_far = Present(stage);
+        if (toReturn <= by) m_far = Present(stage);
         if (toTarget <= by || toStop <= by) {
             const bool onTarget = toTarget <= by;
             const std::optional<double> control =

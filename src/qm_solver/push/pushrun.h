@@ -35,6 +35,8 @@ private:
     double Present(const T_PUSH_STAGE& stage) const;
     double ToTarget(const T_PUSH_STAGE& stage) const;
     double ToStop(const T_PUSH_STAGE& stage, T_PUSH_END& end) const;
+    double ToReturn(const T_PUSH_STAGE& stage) const;
+    bool IsBehind(const T_PUSH_STAGE& stage) const;
     bool StopsHere(const T_PUSH_STAGE& stage, T_PUSH_END& end);
     double Reaction(const T_PUSH_STAGE& stage) const;
     double ReactionRate(const T_PUSH_STAGE& stage) const;
@@ -55,6 +57,7 @@ private:
     std::vector<T_TARGET> m_targets;
     std::size_t m_target = 0;
     double m_start = 0.0, m_sign = 1.0;
+    double m_far = 0.0;    // furthest control displacement of the stage
     double m_origin = 0.0; // control displacement before the first stage
     bool m_isFirst = true;
     T_PEAK m_peak;

@@ -30,6 +30,7 @@ void CPushRun::MakeTargets(const T_PUSH_STAGE& stage)
     m_isFirst = false;
     if (!byLoad && stage.target < m_start) m_sign = -1.0;
     m_peak = {};
+    m_far = m_start;
     m_targets.clear();
     m_target = 0;
     const double way = stage.target - m_start;
@@ -72,6 +73,22 @@ double CPushRun::ToTarget(const T_PUSH_STAGE& stage) const
     return first;
 }
 
+/// Along the rates, to the furthest displacement so far, where the path has gone back from it: a
+/// drop takes displacement and load back until the structure has shed what the hinge has lost. What
+/// is held by its displacement jumps over that way, so nothing stops on it.
+double CPushRun::ToReturn(const T_PUSH_STAGE& stage) const
+{
+    const double rate = m_sign * m_path->Rate().control;
+    return rate > 0.0 ? m_sign * (m_far - Present(stage)) / rate : CHingeBackbone::kFar;
+}
+
+bool CPushRun::IsBehind(const T_PUSH_STAGE& stage) const
+{
+    if (stage.control == PUSH_CONTROL::LoadFactor) return false;
+    return m_sign * m_path->Rate().control < 0.0 ||
+           m_sign * (m_far - Present(stage)) > kOnTarget * std::fabs(stage.target - m_start);
+}
+
 double CPushRun::Reaction(const T_PUSH_STAGE& stage) const
 {
     return -Base()[static_cast<std::size_t>(stage.direction)];
@@ -99,8 +116,11 @@ double CPushRun::ToStop(const T_PUSH_STAGE& stage, T_PUSH_END& end) const
     double first = CHingeBackbone::kFar;
     const auto take = [&](double distance, double rate, PUSH_OUTCOME outcome, long hinge,
                           long drift) {
-        if (!(rate > 0.0) || distance / rate >= first) return;
-        first = std::max(0.0, distance) / rate;
+        const bool isBeyond = distance < 0.0; // passed on a way back, found on the return
+        if (!isBeyond && !(rate > 0.0)) return;
+        const double by = isBeyond ? 0.0 : distance / rate;
+        if (by >= first) return;
+        first = by;
         end.outcome = outcome;
         end.hinge = hinge;
         end.drift = drift;
@@ -141,13 +161,15 @@ double CPushRun::ToStop(const T_PUSH_STAGE& stage, T_PUSH_END& end) const
 /// Stops that a change of direction brings, and those of hinges that have just turned.
 bool CPushRun::StopsHere(const T_PUSH_STAGE& stage, T_PUSH_END& end)
 {
-    m_peak.reaction = std::max(m_peak.reaction, m_sign * Reaction(stage));
+    if (IsBehind(stage)) return false;
     const T_PUSH_STOPS& stops = stage.stops;
     const double moved = m_path->WatchRate(m_nodeWatch[0]);
     if (moved != 0.0) {
         const double tangent = ReactionRate(stage) / moved;
         if (m_peak.first == 0.0) m_peak.first = tangent;
-        if (stops.stiffnessRatio > 0.0 && tangent <= stops.stiffnessRatio * m_peak.first) {
+        const bool isForwards = m_sign * moved > 0.0;
+        if (stops.stiffnessRatio > 0.0 && isForwards &&
+            tangent <= stops.stiffnessRatio * m_peak.first) {
             end.outcome = PUSH_OUTCOME::StiffnessStop;
             return true;
         }

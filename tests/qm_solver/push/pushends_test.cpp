@@ -57,6 +57,14 @@ std::vector<T_END_CASE> EndCases()
         .stage.stops.strengthLoss = true;
     add("last point", soft, PUSH_OUTCOME::LastPointStop, 25.0, 25.0 * 8.0 / 300.0 + 1.0)
         .stage.stops.lastPoint = true;
+    // A column that snaps beside a spring of 100: 50 and 133.3 before, 133.3 after. The path goes
+    // back to the origin in between, which is no fall of the reaction.
+    T_PUSH_MODEL beside = YieldingColumn({{0, 100}, {0, 0}});
+    Join(beside.frame, ELEMENT_KIND::Spring, 1, 0, {100, 0, 0, 0, 0, 0});
+    add("half of the peak is left", beside, PUSH_OUTCOME::Reached, 300.0, 3.0)
+        .stage.stops.fractionOfPeak = 0.5;
+    add("drop below the part", beside, PUSH_OUTCOME::PeakFractionStop, 400.0 / 3.0, 4.0 / 3.0)
+        .stage.stops.fractionOfPeak = 0.8;
     T_END_CASE& initial = add("initial loads", ideal, PUSH_OUTCOME::InitialLoads, 0.625, 4.0 / 3.0);
     initial.model.initial = PushTo(1.0).loads;
     initial.model.initial.nodal[0].load[0] = 80.0;
