@@ -98,10 +98,14 @@ EXIT_CODE PushWhereMissing(CDBDoc& doc, const std::string& file, const std::set<
     for (const int key : keys) {
         const auto record = doc.Data().Model().pushovers.find(key);
         if (record == doc.Data().Model().pushovers.end() || !record->second.control ||
-            record->second.control->generateStaticAngle ||
-            doc.Data().Content().results.contains(key))
+            record->second.control->generateStaticAngle)
             continue;
-        std::fprintf(stderr, "%s\n", Say("IDS_QM_CLI_PUSHING_FIRST", record->second.name).c_str());
+        std::string why;
+        if (!doc.Data().Content().results.contains(key))
+            why = Say("IDS_QM_CLI_PUSHING_FIRST", record->second.name);
+        else if (!doc.Post().IsStale(key, why))
+            continue;
+        std::fprintf(stderr, "%s\n", why.c_str());
         missing.push_back(key);
     }
     std::vector<T_PUSH_RUN> runs;

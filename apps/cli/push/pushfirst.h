@@ -13,5 +13,6 @@
 EXIT_CODE PushCases(CDBDoc& doc, const std::string& file, const std::vector<int>& keys,
                     std::vector<T_PUSH_RUN>& out);
 
-/// Pushes those that have no results, and says so. A case without control data stays without.
+/// Pushes those that have no results, or old ones of our own, and says so. A case without control
+/// data stays without.
 EXIT_CODE PushWhereMissing(CDBDoc& doc, const std::string& file, const std::set<int>& keys);

@@ -1,6 +1,7 @@
 #include "qm_rps/pushover/evaluation/pushremarks.h"
 
 #include "pushsample.h"
+#include "qm_db/analysisframe.h"
 #include "qm_rps/pushovercurvedlg.h"
 
 #include <gtest/gtest.h>
@@ -194,4 +195,16 @@ TEST(PushRemarks, KeepsQuietWithinItsLimits)
     s.content.model.modes[2].period = 0.50;
     s.eval.elasticDamping = 5.0;
     EXPECT_EQ("", Remarks(s));
+}
+
+TEST(PushRemarks, StepsOlderThanTheModelAreNamed)
+{
+    T_SET_UP s = Sample(METHOD::Atc40, kAtc);
+    T_RUN_DATA run;
+    run.head.control[0] = 1.0;
+    run.head.print = PrintOfPush(s.content.model, 1);
+    s.content.results = {{1, MakePushRun(run)}};
+    EXPECT_EQ(std::string::npos, Remarks(s).find("older than the model"));
+    s.content.model.nodes.begin()->second.xyz[0] += 1.0;
+    EXPECT_NE(std::string::npos, Remarks(s).find("PUSH_OLD")) << Remarks(s);
 }
