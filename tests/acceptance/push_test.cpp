@@ -203,6 +203,58 @@ INSTANTIATE_TEST_SUITE_P(Frames, PushPath, testing::ValuesIn(kPaths), [](const a
     return std::string(test.param.name) + (*test.param.pDelta ? "_" : "") + test.param.pDelta;
 });
 
+// ---- load control -------------------------------------------------------------------------------
+
+class PushByLoad : public CPushTest, public testing::WithParamInterface<const char*> {};
+
+/// Up to its peak the path does not depend on the control; there a push by load ends, with a hinge
+/// that makes a mechanism, loses strength or leaves P-Delta too little.
+TEST_P(PushByLoad, EndsAtThePeakWithTheSameEvents)
+{
+    json file = Data(GetParam());
+    const json expected = Data(GetParam() + std::string(".expected"));
+    const double peak = expected.at("peak"), beyond = 1.5 * peak; // of the pattern at load factor 1
+    json& push = file["pushover"][0];
+    push["patterns"][0]["factor"] = beyond;
+    push["control"] = {{"increment_method", "force"}, {"master_node_control", true}};
+    if (file.contains("pushover_control") && file["pushover_control"].contains("p_delta"))
+        file["pushover_control"]["p_delta"] = "updated";
+    Write("c.json", file.dump(1));
+    const json run = Json("push c.json --all", 1).at(0);
+    EXPECT_EQ("failed", run.at("status"));
+    EXPECT_EQ("largest load reached", run.at("outcome").at("name"));
+
+    T_VERTICES wanted = Expected(expected.at("events")), found = Found(run.at("events"));
+    const auto top = std::ranges::find_if(wanted, [&](const T_VERTEX& v) {
+        return v.stage == "push" && v.loadFactor > peak * (1.0 - 1e-6);
+    });
+    ASSERT_NE(wanted.end(), top);
+    wanted.erase(top + 1, wanted.end());
+    double highest = 0.0;
+    for (T_VERTEX& v : found) {
+        if (v.stage != "push") continue;
+        v.loadFactor *= beyond;
+        highest = std::max(highest, v.loadFactor);
+    }
+    for (const json& factor : run["load_factor"])
+        highest = std::max(highest, factor.get<double>() * beyond);
+    EXPECT_NEAR(peak, highest, 1e-6 * peak);
+    SortTies(wanted, 1e-6 * peak);
+    SortTies(found, 1e-6 * peak);
+    ASSERT_LE(wanted.size(), found.size());
+    for (std::size_t i = 0; i < wanted.size(); ++i)
+        EXPECT_NEAR(wanted[i].loadFactor, found[i].loadFactor, 1e-6 * peak) << wanted[i].hinge;
+    for (const T_VERTEX& v : found)
+        EXPECT_GE(1.5 * Furthest(expected), std::fabs(v.displacement)) << v.hinge;
+}
+
+INSTANTIATE_TEST_SUITE_P(Frames, PushByLoad,
+                         testing::Values("pc_propped_point", "pc_portal_combined", "pc_two_storey",
+                                         "gr_two_storey_gravity_yield", "pm_portal_linear",
+                                         "pm_portal_concrete", "bb_cantilever_abcde",
+                                         "pd_two_storey", "f3s2b_cap_uniform"),
+                         [](const auto& test) { return std::string(test.param); });
+
 // ---- a frame of the examples against its recorded curve -----------------------------------------
 
 /// Columns 1 (load factor) and 4 (control displacement) of a recorder table, row by row.
