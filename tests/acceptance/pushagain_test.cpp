@@ -156,6 +156,25 @@ TEST_F(PushAgain, IsTheSameInOtherUnits)
     EXPECT_NEAR(base, b["base_reaction"].back().get<double>() / kKips, 1e-9 * std::fabs(base));
 }
 
+/// The forces of these frames are masses times the first mode, 1 at the control node, of another
+/// eigenvalue solution.
+TEST_F(PushAgain, ByAModeOfTheModelIsThatByItsForces)
+{
+    for (const char* name : {"f3s2b_rigid_mode1", "f3s2b_cap_mode1", "f9s5b_mode1"}) {
+        const json file = Data(name);
+        json byMode = file;
+        const json row = {{"kind", "mode x story mass"}, {"number", 1}, {"factor", 1}};
+        byMode["pushover"][0]["patterns"] = json::array({row});
+        byMode["pushover"][0]["pattern"] = {{"kind", "mode x story mass"}, {"modes", {1}}};
+        const json a = Pushed(file), b = Pushed(byMode);
+        const double base = a["base_reaction"][0];
+        ASSERT_EQ(a["base_reaction"].size(), b["base_reaction"].size()) << name;
+        for (std::size_t i = 0; i < a["base_reaction"].size(); ++i)
+            EXPECT_NEAR(a["base_reaction"][i], b["base_reaction"][i], 1e-9 * base) << name;
+        EXPECT_EQ(Found(a["events"]).size(), Found(b["events"]).size()) << name;
+    }
+}
+
 /// Area under a backbone of deformations and forces from 0 on, level beyond its end.
 double Area(const std::vector<std::array<double, 2>>& backbone, double deformation)
 {
