@@ -10,6 +10,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstdlib>
 #include <string>
 #include <vector>
 
@@ -236,6 +237,25 @@ void PushEightCases(benchmark::State& state)
     }
 }
 
+/// The whole program on a frame of nine storeys with P-Delta and loss of strength, start to exit.
+void NineStoreys(benchmark::State& state, const std::string& command)
+{
+    const std::string line = std::string(QM_RPS_PROGRAM) + " " + command +
+                             " " QM_EXAMPLES "/../tests/data/push/f9s5b_mode1.json > /dev/null";
+    for (auto _ : state)
+        if (std::system(line.c_str()) != 0) state.SkipWithError("the program failed");
+}
+void PushNineStoreys(benchmark::State& state)
+{
+    NineStoreys(state, "push");
+}
+void AnalyseNineStoreys(benchmark::State& state)
+{
+    NineStoreys(state, "analyse");
+}
+BENCHMARK(PushNineStoreys)->Unit(benchmark::kMillisecond)->UseRealTime();
+BENCHMARK(AnalyseNineStoreys)->Unit(benchmark::kMillisecond)->UseRealTime();
+
 BENCHMARK(PushSmall)->Unit(benchmark::kMillisecond);
 BENCHMARK(PushMiddle)->Unit(benchmark::kMillisecond);
 BENCHMARK(PushLarge)->Unit(benchmark::kMillisecond)->Iterations(1);
@@ -251,6 +271,8 @@ BENCHMARK(PushEightCases)->Unit(benchmark::kMillisecond);
         {"push of 990 members / their linear analysis", "PushMiddle", "AnalyseMiddle", 1.0, 30.0}),
     AddRatio(
         {"push of 9,870 members / their linear analysis", "PushLarge", "AnalyseLarge", 1.0, 100.0}),
+    AddRatio({"program: push of 9 storeys / their linear analysis", "PushNineStoreys",
+              "AnalyseNineStoreys", 1.0, 5.0}),
     AddRatio({"push in eight load cases / in one", "PushEightCases", "PushMiddle", 1.0, 5.0}),
 };
 
