@@ -2,6 +2,7 @@
 
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/evaluatedsteps.h"
 #include "qm_rps/push/pushquantity.h"
 #include "qm_rps/push/pushresultlist.h"
 #include "qm_rps/push/pushworker.h"
@@ -84,18 +85,54 @@ int CPushOverRunDlg::OnRun()
     m_curves.clear();
     m_runs.clear();
     m_rows.clear();
+    std::vector<T_PUSH_TASK> tasks;
+    for (const int key : m_chosen)
+        tasks.push_back({key});
+    int done = Push(tasks);
+    tasks = FurtherTasks();
+    if (!tasks.empty() && !m_cancel) done = Push(tasks) && done ? 1 : 0;
+    if (m_changed) m_changed();
+    return done;
+}
+
+int CPushOverRunDlg::Push(const std::vector<T_PUSH_TASK>& tasks)
+{
     int done = 0;
     {
         const CRunning running(m_doc.Data(), m_running);
-        CPushWorker worker(m_doc, {m_chosen.begin(), m_chosen.end()});
+        CPushWorker worker(m_doc, tasks);
         Watch(worker);
         done = TakeResults(worker);
         m_paused = false;
     }
-    CPushRun keeper(m_doc);
-    keeper.Keep(m_runs);
-    if (m_changed) m_changed();
+    CPushRun(m_doc).Keep(m_runs);
     return done;
+}
+
+std::vector<T_PUSH_TASK> CPushOverRunDlg::FurtherTasks() const
+{
+    std::vector<T_PUSH_TASK> tasks;
+    for (auto from = m_runs.begin(); from != m_runs.end();) { // those of a load case together
+        const auto to = std::find_if(from, m_runs.end(),
+                                     [&](const T_PUSH_RUN& run) { return run.key != from->key; });
+        T_PUSH_TASK task{from->key, StepsOfEvaluations(m_doc, {from, to})};
+        if (!task.extra.empty()) tasks.push_back(std::move(task));
+        from = to;
+    }
+    return tasks;
+}
+
+void CPushOverRunDlg::TakeStep(const T_PUSH_PROGRESS& step)
+{
+    if (step.done == 1)
+        std::erase_if(m_curves, [&](const T_CURVE& c) { return c.name == step.name; });
+    if (m_curves.empty() || m_curves.back().name != step.name)
+        m_curves.push_back({step.name, 0, 0, {}, {}});
+    T_CURVE& curve = m_curves.back();
+    curve.done = step.done;
+    curve.total = step.total;
+    curve.displacement.push_back(step.displacement);
+    curve.baseReaction.push_back(step.baseReaction);
 }
 
 void CPushOverRunDlg::Watch(CPushWorker& worker)
@@ -107,15 +144,8 @@ void CPushOverRunDlg::Watch(CPushWorker& worker)
     while (!ended) {
         steps.clear();
         ended = worker.TakeSteps(kWaitMs, steps);
-        for (const T_PUSH_PROGRESS& step : steps) {
-            if (m_curves.empty() || m_curves.back().name != step.name)
-                m_curves.push_back({step.name, 0, 0, {}, {}});
-            T_CURVE& curve = m_curves.back();
-            curve.done = step.done;
-            curve.total = step.total;
-            curve.displacement.push_back(step.displacement);
-            curve.baseReaction.push_back(step.baseReaction);
-        }
+        for (const T_PUSH_PROGRESS& step : steps)
+            TakeStep(step);
         if (m_changed && !steps.empty()) m_changed();
         if (View()) View()->DispatchEvents();
         worker.Pause(m_paused);
@@ -127,6 +157,10 @@ int CPushOverRunDlg::TakeResults(CPushWorker& worker)
 {
     int done = 1;
     for (T_PUSH_DONE& one : worker.Finish()) {
+        if (!one.runs.empty()) { // in place of those of a first round
+            std::erase_if(m_rows, [&](const T_ROW& row) { return row.key == one.key; });
+            std::erase_if(m_runs, [&](const T_PUSH_RUN& run) { return run.key == one.key; });
+        }
         for (T_PUSH_RUN& run : one.runs) {
             AddRow(run);
             m_runs.push_back(std::move(run));
@@ -134,6 +168,7 @@ int CPushOverRunDlg::TakeResults(CPushWorker& worker)
         if (one.error.empty()) continue;
         done = 0;
         T_ROW& row = m_rows.emplace_back();
+        row.key = one.key;
         row.name = m_doc.Data().Model().pushovers.at(one.key).name;
         row.outcome = Say("IDS_QM_UI_PUSH_RUN_REFUSED");
         row.advice = one.error;
@@ -143,7 +178,8 @@ int CPushOverRunDlg::TakeResults(CPushWorker& worker)
 
 void CPushOverRunDlg::AddRow(const T_PUSH_RUN& run)
 {
-    T_ROW row{run.name,
+    T_ROW row{run.key,
+              run.name,
               run.outcome,
               run.advice,
               run.status != PUSH_STATUS::Failed,

@@ -7,6 +7,7 @@
 #include <set>
 
 class CPushWorker;
+struct T_PUSH_TASK;
 
 class CPushOverRunDlg : public zql::frx::MDialog {
 public:
@@ -25,6 +26,7 @@ public:
     };
     /// What has come of a load case, or of a direction of it.
     struct T_ROW {
+        int key = 0;                       // of the load case
         std::string name, outcome, advice; // advice: also why it could not be pushed
         bool reached = false;              // the target, or a stop that was asked for
         std::size_t steps = 0;
@@ -42,8 +44,9 @@ public:
     void OnChoose(std::size_t row, bool chosen);
 
     /// Pushes the chosen load cases in a thread of their own and calls m_changed with each news;
-    /// in the end the results are those of the document. 1 each came to an end, good or not; 0
-    /// nothing is chosen, or a load case could not be pushed (its row says why).
+    /// in the end the results are those of the document. Load cases that ask for steps at what
+    /// their evaluations find are then pushed again with these. 1 each came to an end, good or not;
+    /// 0 nothing is chosen, or a load case could not be pushed (its row says why).
     [[nodiscard]] int OnRun();
     bool CanRun() const { return !m_running && !m_chosen.empty(); }
     bool IsRunning() const { return m_running; }
@@ -66,7 +69,10 @@ public:
     CDBDoc& Doc() { return m_doc; }
 
 private:
+    [[nodiscard]] int Push(const std::vector<T_PUSH_TASK>& tasks);
+    std::vector<T_PUSH_TASK> FurtherTasks() const;
     void Watch(CPushWorker& worker);
+    void TakeStep(const T_PUSH_PROGRESS& step);
     [[nodiscard]] int TakeResults(CPushWorker& worker);
     void AddRow(const T_PUSH_RUN& run);
 

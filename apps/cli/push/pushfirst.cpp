@@ -4,7 +4,7 @@
 #include "output.h"
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
-#include "qm_rps/pushovercalculators.h"
+#include "qm_rps/evaluatedsteps.h"
 
 #include <cstdio>
 #include <unistd.h>
@@ -22,49 +22,17 @@ bool ShowStep(const T_PUSH_PROGRESS& p, const T_UNITS& units)
     return !CInterrupt::IsAsked();
 }
 
-/// Displacements (m) at the performance points and targets of the evaluations of a load case.
-std::vector<double> EvaluatedDisplacements(CDBDoc& doc, const T_POLC_D& record)
-{
-    std::vector<double> out;
-    const double sign =
-        record.control && record.control->masterNodeControl && record.control->masterMaxDispl < 0.0
-            ? -1.0
-            : 1.0;
-    CPushEvaluator evaluator(doc, RunPerfPtProcedure);
-    evaluator.SetStoreSteps(false);
-    evaluator.SetFindAllPoints(false);
-    for (const auto& entry : doc.Data().Model().evaluations) {
-        T_EVAL_D eval;
-        T_FINDING refusal;
-        if (entry.second.push != record.name || !doc.Attr().GetEval(entry.first, eval) ||
-            !evaluator.SetEvaluation(eval, refusal) || evaluator.Evaluate() == 0)
-            continue;
-        const T_PUSH_EVALUATION& result = evaluator.Result();
-        const auto add = [&](double d) {
-            const double si = sign * std::fabs(ToSi(d, doc.Unit().Units(), kDimLength));
-            if (si != 0.0 && IsOnTheWay(record, si)) out.push_back(si);
-        };
-        if (result.point) add(result.point->D);
-        for (const T_LIMIT_ROW& row : result.limitStates)
-            if (row.demand) add(*row.demand);
-    }
-    return out;
-}
-
 EXIT_CODE PushOne(CDBDoc& doc, const std::string& file, CPushRun& push, int key,
                   std::vector<T_PUSH_RUN>& out)
 {
     const T_UNITS units = doc.Unit().Units();
     const auto progress = [&](const T_PUSH_PROGRESS& p) { return ShowStep(p, units); };
-    const T_POLC_D record = doc.Data().Model().pushovers.at(key);
     std::vector<T_PUSH_RUN> runs;
     std::string error;
     if (!push.Run(key, progress, runs, error))
         return Complain(EXIT_CODE::BadInput, file + ": " + error);
     push.Keep(runs);
-    const bool again = record.additionalEvaluations && runs.size() == 1 && !runs[0].cancelled;
-    const std::vector<double> points =
-        again ? EvaluatedDisplacements(doc, record) : std::vector<double>();
+    const std::vector<double> points = StepsOfEvaluations(doc, runs);
     if (!points.empty()) {
         std::vector<T_PUSH_RUN> exact;
         if (!push.Run(key, progress, exact, error, points))

@@ -7,8 +7,8 @@
 #include <new>
 #include <utility>
 
-CPushWorker::CPushWorker(CDBDoc& doc, std::vector<int> keys)
-    : m_keys(std::move(keys)), m_push(doc), m_thread([this] { Run(); })
+CPushWorker::CPushWorker(CDBDoc& doc, std::vector<T_PUSH_TASK> tasks)
+    : m_tasks(std::move(tasks)), m_push(doc), m_thread([this] { Run(); })
 {
 }
 
@@ -58,12 +58,12 @@ bool CPushWorker::Tell(const T_PUSH_PROGRESS& step)
     return !m_isCancelled;
 }
 
-void CPushWorker::PushOne(int key)
+void CPushWorker::PushOne(const T_PUSH_TASK& task)
 {
-    T_PUSH_DONE done{key, {}, {}};
+    T_PUSH_DONE done{task.key, {}, {}};
     try {
         const auto tell = [this](const T_PUSH_PROGRESS& step) { return Tell(step); };
-        if (!m_push.Run(key, tell, done.runs, done.error) && done.error.empty())
+        if (!m_push.Run(task.key, tell, done.runs, done.error, task.extra) && done.error.empty())
             done.error = Say("IDS_QM_PUSH_NO_RUN");
     } catch (const std::bad_alloc&) { // a thread must not throw
         done.runs.clear();
@@ -77,12 +77,12 @@ void CPushWorker::PushOne(int key)
 
 void CPushWorker::Run()
 {
-    for (const int key : m_keys) {
+    for (const T_PUSH_TASK& task : m_tasks) {
         {
             const std::lock_guard lock(m_mutex);
             if (m_isCancelled) break;
         }
-        PushOne(key);
+        PushOne(task);
     }
     const std::lock_guard lock(m_mutex);
     m_isDone = true;

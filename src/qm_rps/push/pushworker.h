@@ -7,6 +7,13 @@
 #include <mutex>
 #include <thread>
 
+/// A load case, and displacements of its control node (m) that are steps beside those of the
+/// record.
+struct T_PUSH_TASK {
+    int key = 0;
+    std::vector<double> extra{};
+};
+
 /// What has come of one load case.
 struct T_PUSH_DONE {
     int key = 0;
@@ -20,7 +27,7 @@ struct T_PUSH_DONE {
 class CPushWorker {
 public:
     /// Throws std::system_error when there is no thread to be had.
-    CPushWorker(CDBDoc& doc, std::vector<int> keys);
+    CPushWorker(CDBDoc& doc, std::vector<T_PUSH_TASK> tasks);
     /// Cancels and waits for the end.
     ~CPushWorker();
     CPushWorker(const CPushWorker&) = delete;
@@ -39,10 +46,10 @@ public:
 
 private:
     void Run();
-    void PushOne(int key);
+    void PushOne(const T_PUSH_TASK& task);
     bool Tell(const T_PUSH_PROGRESS& step);
 
-    std::vector<int> m_keys;
+    std::vector<T_PUSH_TASK> m_tasks;
     std::mutex m_mutex; // of the five below
     std::condition_variable m_news, m_goOn;
     std::vector<T_PUSH_PROGRESS> m_steps;
