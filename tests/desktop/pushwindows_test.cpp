@@ -29,7 +29,9 @@ protected:
         T_PUSH_RUN run;
         std::string error;
         for (const T_PUSH_RESULT_ID& id : PushResultsOf(doc))
-            if (id.name == name) EXPECT_TRUE(CPushRun(doc).Read(id.key, id.turn, run, error));
+            if (id.name == name) {
+                EXPECT_TRUE(CPushRun(doc).Read(id.key, id.turn, run, error));
+            }
         EXPECT_EQ("", error);
         return run;
     }
