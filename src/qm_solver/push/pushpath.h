@@ -124,7 +124,7 @@ private:
     T_FAULT Apply(const T_CHANGE& change);
     T_FAULT Sync(std::size_t flow);
     T_FAULT SyncTouched();
-    void NoteTurns();
+    void NoteTurns(bool isEnd);
     void Remember();
 
     CHingeBackbone& Backbone(std::size_t flow)

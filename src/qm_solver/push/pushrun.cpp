@@ -11,7 +11,7 @@ constexpr std::size_t kStepBlock = 16; // stored steps that are solved together
 constexpr double kBalanced = 1e-8;     // residual of a stored step
 constexpr double kTensionKept = 1e-10; // of the largest axial force: P-Delta is up to date
 constexpr int kMostUpdates = 30;
-constexpr double kMechanism = 1e-9; // rate of the loads against what flows
+constexpr double kMechanism = 1e-6; // of the elastic answer: less is rounding, not stiffness
 
 bool IsEmpty(const T_LOAD_CASE& loads)
 {
@@ -200,7 +200,7 @@ CPushRun::T_FAULT CPushRun::Store(const T_PUSH_STAGE& stage, int number, bool ad
     if (number < 0) return {};
     T_PUSH_STEP& step = m_steps.emplace_back();
     step.stage = static_cast<std::size_t>(number);
-    step.loadFactor = m_path->Factor();
+    step.loadFactor = m_stored = m_path->Factor();
     step.displacement = stage.control == PUSH_CONTROL::LoadFactor ? m_path->Watched(m_nodeWatch[0])
                                                                   : Present(stage);
     step.additional = additional;
@@ -247,6 +247,15 @@ CPushRun::T_FAULT CPushRun::Follow(const T_PUSH_STAGE& stage, int number, T_PUSH
 {
     const bool byLoad = stage.control == PUSH_CONTROL::LoadFactor;
     const auto finish = [&](PUSH_OUTCOME outcome) -> T_FAULT {
+        // The last state that stands is a step, too.
+        const bool isStep = outcome == PUSH_OUTCOME::NoEquilibrium ||
+                            outcome == PUSH_OUTCOME::NoPath ||
+                            outcome == PUSH_OUTCOME::AxialStrength;
+        if (isStep && number >= 0 && m_path->Factor() != m_stored && !IsBehind(stage)) {
+            if (auto fault = m_path->Correct(std::nullopt)) return fault;
+            if (auto fault = Store(stage, number, false, end)) return fault;
+            if (m_cancelled) outcome = end.outcome;
+        }
         end.outcome = outcome;
         end.loadFactor = m_path->Factor();
         if (!m_nodeWatch.empty())
@@ -292,7 +301,9 @@ CPushRun::T_FAULT CPushRun::Follow(const T_PUSH_STAGE& stage, int number, T_PUSH
         if (toTarget <= by || toStop <= by) {
             const bool onTarget = toTarget <= by;
             const std::optional<double> control =
-                onTarget && !byLoad ? std::optional(m_targets[m_target].value) : std::nullopt;
+                onTarget && stage.control == PUSH_CONTROL::Displacement
+                    ? std::optional(m_targets[m_target].value)
+                    : std::nullopt;
             if ((fault = m_path->Correct(control))) return fault;
             if (IsUpdated() && number >= 0 && (fault = Update(stage, control))) return fault;
             if ((fault = Store(stage, number, onTarget && m_targets[m_target].additional, end)))

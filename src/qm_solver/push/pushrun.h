@@ -57,6 +57,7 @@ private:
     std::vector<T_TARGET> m_targets;
     std::size_t m_target = 0;
     double m_start = 0.0, m_sign = 1.0;
+    double m_stored = 0.0; // load factor of the last stored step
     double m_far = 0.0;    // furthest control displacement of the stage
     double m_origin = 0.0; // control displacement before the first stage
     bool m_isFirst = true;

@@ -221,8 +221,9 @@ void CPushPath::Touch(std::size_t f)
     m_touched.try_emplace(f, T_WAS{backbone.On(), backbone.Vertex()});
 }
 
-/// Vertices passed, hinges that unload and load again.
-void CPushPath::NoteTurns()
+/// Vertices passed, hinges that unload and load again. Where the path ends nothing goes on after
+/// them: vertices alone.
+void CPushPath::NoteTurns(bool isEnd)
 {
     for (const auto& [f, was] : m_touched) {
         const CPushFlow& flow = m_flows.flows[f];
@@ -232,7 +233,7 @@ void CPushPath::NoteTurns()
         };
         for (int v = was.vertex + 1; v <= now.Vertex(); ++v)
             note(HINGE_TURN::Point, v);
-        if (now.Vertex() != was.vertex) continue;
+        if (isEnd || now.Vertex() != was.vertex) continue;
         const bool wasOn = was.on == ON::Virgin, isOn = now.On() == ON::Virgin;
         if (wasOn && !isOn && now.On() != ON::Drop) note(HINGE_TURN::Unload, now.Vertex());
         if (!wasOn && isOn && was.on != ON::Drop) note(HINGE_TURN::Reload, now.Vertex());
@@ -255,10 +256,10 @@ CPushPath::WAY CPushPath::Select(T_FAULT& fault)
 {
     if ((fault = SyncTouched())) return WAY::Fault;
     for (int round = 0; round < kMostRounds; ++round) {
-        if (!MakeRates()) return WAY::None;
+        if (!MakeRates()) break;
         std::vector<T_CHANGE> changes = Violations();
         if (changes.empty()) {
-            NoteTurns();
+            NoteTurns(false);
             Remember();
             return WAY::On;
         }
@@ -271,6 +272,7 @@ CPushPath::WAY CPushPath::Select(T_FAULT& fault)
         for (const T_CHANGE& change : changes)
             if ((fault = Apply(change))) return WAY::Fault;
     }
+    NoteTurns(true);
     return WAY::None;
 }
 

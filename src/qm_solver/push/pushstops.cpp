@@ -31,6 +31,7 @@ void CPushRun::MakeTargets(const T_PUSH_STAGE& stage)
     if (!byLoad && stage.target < m_start) m_sign = -1.0;
     m_peak = {};
     m_far = m_start;
+    m_stored = 0.0;
     m_targets.clear();
     m_target = 0;
     const double way = stage.target - m_start;
