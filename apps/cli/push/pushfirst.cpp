@@ -71,7 +71,9 @@ EXIT_CODE PushWhereMissing(CDBDoc& doc, const std::string& file, const std::set<
         std::string why;
         if (!doc.Data().Content().results.contains(key))
             why = Say("IDS_QM_CLI_PUSHING_FIRST", record->second.name);
-        else if (!doc.Post().IsStale(key, why))
+        else if (doc.Post().IsStale(key, why))
+            why += " " + Say("IDS_QM_CLI_PUSHING_AGAIN");
+        else
             continue;
         std::fprintf(stderr, "%s\n", why.c_str());
         missing.push_back(key);
