@@ -85,7 +85,8 @@ std::string ListJson(const DLG& dialog)
     return w.Text();
 }
 
-EXIT_CODE Draw(DLG& dialog, const std::string& name, const T_PUSH_FUNCTION_OPTIONS& o)
+EXIT_CODE Draw([[maybe_unused]] DLG& dialog, [[maybe_unused]] const std::string& name,
+               [[maybe_unused]] const T_PUSH_FUNCTION_OPTIONS& o)
 {
 #ifdef QM_UI
     if (!name.empty() && !dialog.Select(name))
