@@ -214,10 +214,6 @@ void CRemarks::OnParticipation()
 
 void AddRemarks(CDBDoc& doc, const T_SPFC_D& spectrum, T_PUSH_EVALUATION& result)
 {
-    int push = 0;
-    std::string why;
-    if (doc.Attr().FindPolc(result.eval.push, push) && doc.Post().IsStale(push, why))
-        result.messages.push_back({"IDS_QM_DB_PUSH_OLD", why});
     if (result.capacity.Sd.size() < 2 || !(result.factors.gamma > 0.0)) return;
     CRemarks remarks(doc, spectrum, result);
     remarks.OnDamping();
