@@ -95,14 +95,15 @@ TEST_F(PushSetup, EveryKeyIsSetAndTakenBack)
 
 TEST_F(PushSetup, ShowsWhatActs)
 {
-    Done("push setup @eccentric-building --case PX --steps 12 -o c.json");
+    Done("push setup @eccentric-building --steps 33 -o g.json");
+    Done("push setup g.json --case PX --steps 12 --target 0.4 -o c.json");
     const json shown = Json("push setup c.json");
     const json& px = CaseOf(shown, "PX");
     ExpectKeys(px, {{"/steps", "12"},
                     {"/own", "[\"steps\"]"},
                     {"/p_delta", "\"initial\""}, // of the global control
                     {"/initial_loads", R"([{"case": "G", "factor": 1}])"}});
-    EXPECT_EQ(80, CaseOf(shown, "PY").at("steps"));
+    EXPECT_EQ(33, CaseOf(shown, "PY").at("steps"));
     ExpectHolds(Done("push setup c.json"), {"G x 1  (global)", "0.4 m", "acceleration:DX x 1"});
 }
 

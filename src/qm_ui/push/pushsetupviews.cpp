@@ -40,11 +40,11 @@ void BuildGlobal(CFormView& form, CPushOverGlobalControlDlg& d)
 {
     T_POGC_D& c = d.m_control;
     form.Note(KeyText("IDS_QM_UI_POGC_NOTE"));
+    form.Page(KeyText("IDS_QM_UI_POGC_ANALYSIS"));
     form.Group(KeyText("IDS_QM_UI_POGC_INITIAL"));
     form.Grid(InitialLoadGrid(d, [&c] { return &c.initialLoads; })).name = "initialLoads";
     form.Note(KeyText("IDS_QM_UI_POGC_ZERO")).shown = [&c] { return c.initialLoads.empty(); };
     form.EndGroup();
-    form.Group(KeyText("IDS_QM_UI_POGC_ANALYSIS"));
     form.Choice(KeyText("IDS_QM_UI_POGC_P_DELTA"), IndexRef(c.pDelta), PDeltaTexts).name = "pDelta";
     form.Integer(KeyText("IDS_QM_UI_POGC_STEPS"), Ref(c.steps)).name = "steps";
     form.Choice(KeyText("IDS_QM_UI_POGC_FAILURE"), IndexRef(c.onFailure), FailureTexts).name =
@@ -54,10 +54,9 @@ void BuildGlobal(CFormView& form, CPushOverGlobalControlDlg& d)
         .name = "flow";
     form.Integer(KeyText("IDS_QM_UI_POGC_EVENTS"), Ref(c.mostEvents)).name = "mostEvents";
     form.Integer(KeyText("IDS_QM_UI_POGC_MOST_STEPS"), Ref(c.mostSteps)).name = "mostSteps";
-    form.EndGroup();
-    form.Group(KeyText("IDS_QM_UI_POGC_TYPES"));
+    form.Page(KeyText("IDS_QM_UI_POGC_TYPES"));
     form.Grid(TypeGrid(d)).name = "hingeTypes";
-    form.EndGroup();
+    form.EndPages();
 }
 
 // ---- increment functions ------------------------------------------------------------------------
@@ -91,6 +90,16 @@ T_GRID_BINDING FunctionGrid(FUNCTIONS& d)
     return grid;
 }
 
+/// What a rule says of a cell that is not above the one before it.
+std::string RowMark(FUNCTIONS& d, std::size_t row, std::size_t column)
+{
+    const std::vector<double>& values = column == 0 ? d.Selected()->step : d.Selected()->factor;
+    const bool rises = row >= values.size() || values[row] > (row ? values[row - 1] : 0.0);
+    for (const T_FINDING& finding : d.Findings())
+        if (!rises && finding.field == (column == 0 ? "step" : "factor")) return finding.text;
+    return {};
+}
+
 T_GRID_BINDING RowsGrid(FUNCTIONS& d)
 {
     T_GRID_BINDING grid;
@@ -102,6 +111,9 @@ T_GRID_BINDING RowsGrid(FUNCTIONS& d)
     };
     grid.set = [&d](std::size_t row, std::size_t column, const std::string& text) {
         return d.Selected() ? SetFunctionRow(*d.Selected(), row, column, text) : 0;
+    };
+    grid.mark = [&d](std::size_t row, std::size_t column) {
+        return d.Selected() ? RowMark(d, row, column) : std::string();
     };
     grid.rowHead = [&d](std::size_t row) {
         return d.Selected() && row < d.Selected()->step.size() ? std::to_string(row + 1)
@@ -120,7 +132,7 @@ void BuildFunctions(CFormView& form, FUNCTIONS& d)
     CFormField& erase = form.Button(KeyText("IDS_QM_UI_POFC_DELETE"), [&d] { (void)d.OnDelete(); });
     erase.name = "delete";
     erase.enabled = chosen;
-    form.NextColumn();
+    form.NextColumn(1);
     CFormField& name =
         form.Text(KeyText("IDS_QM_UI_POFC_NAME"),
                   {[&d] { return d.Selected() ? d.Selected()->name : std::string(); },
@@ -129,11 +141,10 @@ void BuildFunctions(CFormView& form, FUNCTIONS& d)
                    }});
     name.name = "name";
     name.enabled = chosen;
-    form.Grid(RowsGrid(d)).name = "step";
-    form.NextColumn(1);
+    form.Grid(RowsGrid(d)).name = "rows";
     AddPicture(form,
                [&d] { return IncrementFunctionPlot(d.Selected() ? *d.Selected() : T_POFC_D()); },
-               {420, 320})
+               {480, 280})
         .name = "plot";
     form.EndColumns();
 }
@@ -191,8 +202,8 @@ void BuildGenerator(CFormView& form, GENERATOR& d)
 void RegisterPushSetupForms(CViewFactory& factory)
 {
     T_VIEW global, functions, generator;
-    global.size = {620, 640};
-    functions.size = {960, 460};
+    global.size = {620, 520};
+    functions.size = {720, 640};
     generator.size = {560, 560};
     factory.Register<CPushOverGlobalControlDlg>(KeyText("IDS_QM_UI_POGC_TITLE"), BuildGlobal,
                                                 global);
