@@ -55,7 +55,6 @@ std::size_t Points(CDialogWindow& w)
 void Slide(CDialogWindow& w, int step)
 {
     w.findChild<QSlider*>()->setValue(step);
-    Settle();
 }
 
 } // namespace
@@ -130,7 +129,8 @@ TEST_F(PushWindows, HingesAreShownByStepAndChosenByAClickOnTheFrame)
     PushIt();
     const T_PUSH_RUN run = Stored();
     const ACT look = [&](CDialogWindow& w) {
-        auto* frame = w.findChild<CFrameView*>();
+        auto* frame = dynamic_cast<CFrameView*>(Field(w, "frame"));
+        ASSERT_NE(nullptr, frame);
         ASSERT_NE(nullptr, frame->Picture().marks);
         EXPECT_EQ(run.hinges.size(), frame->Picture().marks->hinges.size());
         QAbstractItemModel& table = Grid(w, "hinges").Model();
