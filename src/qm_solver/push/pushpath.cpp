@@ -58,14 +58,14 @@ void CPushPath::UpdateLock(std::size_t f)
             flow.force,       true};
 }
 
-bool CPushPath::LoadGrows(double part) const
+double CPushPath::LoadRate() const
 {
     const std::vector<double>& loads = m_structure.Loads(m_factors.size() - 1).force;
     double most = 0.0;
-    for (const CPushFlow& flow : m_flows.flows)
-        for (const std::size_t r : flow.Rows())
-            most = std::max(most, std::fabs(loads[r]) / flow.force);
-    return m_rate.factor > 0.0 && m_rate.factor * most >= part * Norm();
+    for (std::size_t r = 0; r < loads.size(); ++r)
+        most = std::max(most, std::fabs(loads[r]) * m_byForce[r]);
+    const double rate = m_rate.factor * most;
+    return std::fabs(rate) >= kMechanism * m_norm ? rate : 0.0;
 }
 
 std::size_t CPushPath::Watch(T_PROBE probe)

@@ -41,6 +41,8 @@ class CPushPath {
 public:
     /// Rates below this part of the largest one, both by strengths, count as none.
     static constexpr double kLeastRate = 1e-9;
+    /// Of the elastic answer: a smaller one is the rounding of a mechanism.
+    static constexpr double kMechanism = 1e-6;
     using T_FAULT = std::optional<T_SOLVER_ERROR>;
 
     CPushPath(const T_PUSH_MODEL& model, CPushStructure& structure);
@@ -92,8 +94,8 @@ public:
     /// Plastic and elastic part of the deformation of a law, and its rate.
     double Deformation(std::size_t hinge, std::size_t law, double& rate) const;
     const T_PUSH_FLOWS& Flows() const { return m_flows; }
-    /// The loads grow along the rates: by more than this part of what flows and what forces change.
-    bool LoadGrows(double part) const;
+    /// The loads grow along the rates.
+    bool LoadGrows() const { return LoadRate() > 0.0 || (m_rate.factor > 0.0 && m_norm == 0.0); }
     /// Conditions hang on the axial force in more than a straight way: steps need Correct.
     bool IsCurved() const { return m_isCurved; }
 
@@ -136,6 +138,8 @@ private:
         return m_flows.backbones[m_flows.flows[flow].backbone];
     }
     // pushpath.cpp
+    /// Rate of the loads as that of the elastic forces that they make; 0 in a mechanism.
+    double LoadRate() const;
     T_FAULT Rebuild();
     T_FAULT Rebase();
     void SumUp();

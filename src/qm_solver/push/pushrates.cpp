@@ -102,7 +102,7 @@ double CPushPath::DriveSign() const
         sum = m_drive.sign * m_rate.control;
         break;
     case KIND::Factor:
-        sum = m_drive.sign * m_rate.factor;
+        sum = m_drive.sign * LoadRate();
         break;
     case KIND::Flows:
         for (const std::size_t f : m_drive.flows)

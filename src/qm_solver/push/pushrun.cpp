@@ -11,7 +11,6 @@ constexpr std::size_t kStepBlock = 16; // stored steps that are solved together
 constexpr double kBalanced = 1e-8;     // residual of a stored step
 constexpr double kTensionKept = 1e-10; // of the largest axial force: P-Delta is up to date
 constexpr int kMostUpdates = 30;
-constexpr double kMechanism = 1e-6; // of the elastic answer: less is rounding, not stiffness
 
 bool IsEmpty(const T_LOAD_CASE& loads)
 {
@@ -281,7 +280,7 @@ CPushRun::T_FAULT CPushRun::Follow(const T_PUSH_STAGE& stage, int number, T_PUSH
             m_path->SetDrive({T_PUSH_DRIVE::KIND::Before, 1.0, {}});
             continue;
         }
-        if (found == CPushPath::WAY::None || (byLoad && !m_path->LoadGrows(kMechanism)))
+        if (found == CPushPath::WAY::None || (byLoad && !m_path->LoadGrows()))
             return finish(byLoad ? PUSH_OUTCOME::NoEquilibrium : PUSH_OUTCOME::NoPath);
         if (number >= 0 && StopsHere(stage, end)) {
             if (m_path->Factor() != 0.0 && (fault = Store(stage, number, false, end))) return fault;
