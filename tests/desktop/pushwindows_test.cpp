@@ -139,7 +139,7 @@ TEST_F(PushWindows, HingesAreShownByStepAndChosenByAClickOnTheFrame)
         EXPECT_TRUE(Says(w, "Step 1 of 108"));
         for (const T_HINGE_MARK& mark : frame->Picture().marks->hinges)
             EXPECT_EQ(PUSH_STATE::Elastic, mark.state);
-        Click(Field(w, "yielded"));
+        Key(Field(w, "yielded"), Qt::Key_Space);
         EXPECT_EQ(0, table.rowCount());
         Slide(w, 108);
         int yielded = 0;
