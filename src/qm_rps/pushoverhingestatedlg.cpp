@@ -32,18 +32,12 @@ void CPushOverHingeStateDlg::OnShown(bool anotherResult)
 
 void CPushOverHingeStateDlg::ShowMoves()
 {
-    const T_FRAME_SCENE& scene = Scene();
-    m_moves.assign(scene.nodes.size(), {});
-    if (Step() < 1) return;
     const T_RUN_DATA& data = Run().data;
-    const auto& moves = data.displacement.at(static_cast<std::size_t>(Step() - 1));
-    for (std::size_t n = 0; n < scene.nodes.size(); ++n) {
-        const auto at = std::ranges::lower_bound(data.nodes, scene.nodes[n].id);
-        if (at == data.nodes.end() || *at != scene.nodes[n].id) continue;
-        const T_DOF6& u = moves[static_cast<std::size_t>(at - data.nodes.begin())];
-        for (std::size_t d = 0; d < 3; ++d)
-            m_moves[n][d] = FromSi(u[d], Units(), kDimLength);
-    }
+    if (Step() > 0)
+        m_moves = MovesOf(Scene(), data.nodes,
+                          data.displacement.at(static_cast<std::size_t>(Step() - 1)), Units());
+    else
+        m_moves.assign(Scene().nodes.size(), {});
 }
 
 void CPushOverHingeStateDlg::ShowRows()

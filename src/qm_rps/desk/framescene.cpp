@@ -60,6 +60,21 @@ std::map<int, T_ENDS<bool>> HingedEnds(const T_MODEL& model)
 
 } // namespace
 
+std::vector<std::array<double, 3>> MovesOf(const T_FRAME_SCENE& scene, const std::vector<int>& ids,
+                                           const std::vector<T_DOF6>& displacement,
+                                           const T_UNITS& units)
+{
+    std::vector<std::array<double, 3>> moves(scene.nodes.size());
+    for (std::size_t n = 0; n < moves.size(); ++n) {
+        const auto at = std::ranges::lower_bound(ids, scene.nodes[n].id);
+        if (at == ids.end() || *at != scene.nodes[n].id) continue;
+        const T_DOF6& u = displacement.at(static_cast<std::size_t>(at - ids.begin()));
+        for (std::size_t d = 0; d < 3; ++d)
+            moves[n][d] = FromSi(u[d], units, kDimLength);
+    }
+    return moves;
+}
+
 void CFrameScene::Build()
 {
     const T_MODEL& model = m_doc.Data().Model();
@@ -191,6 +206,15 @@ int CFrameScene::ReadPushover(int key, int step, T_MOVES& out)
 {
     const auto push = m_doc.Data().Model().pushovers.find(key);
     if (push == m_doc.Data().Model().pushovers.end() || step < 1) return 0;
+    if (IPushRun* const run = m_doc.Post().RunOf(key)) {
+        std::vector<T_DOF6> shape;
+        if (run->ReadShape(step, shape)) {
+            out = MovesOf(m_scene, run->NodeIds(), shape, m_doc.Unit().Units());
+            return 1;
+        }
+        m_error = run->Error();
+        return 0;
+    }
     const auto direction = static_cast<std::size_t>(push->second.direction - 1);
     if (direction < 3 && !ReadSeries(key)) return 0;
     out.assign(m_scene.nodes.size(), {});

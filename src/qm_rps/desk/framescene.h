@@ -43,6 +43,12 @@ struct T_SCENE_DRIFT {
     double drift = 0.0;             // ratio, with its sign
 };
 
+/// Translations of the scene's nodes in current units from displacements (SI) of nodes with these
+/// ids, ascending; nodes without any stay.
+std::vector<std::array<double, 3>> MovesOf(const T_FRAME_SCENE& scene, const std::vector<int>& ids,
+                                           const std::vector<T_DOF6>& displacement,
+                                           const T_UNITS& units);
+
 /// The document must outlive the object. Everything is read again when the document has changed.
 class CFrameScene {
 public:
@@ -54,8 +60,8 @@ public:
     /// None first, then every load case, stage, pushover case and mode that has results.
     std::vector<T_SHAPE_SOURCE> Sources();
     /// Translations of the scene's nodes in current units (of a mode in its own normalisation), at
-    /// the end of the step, from 1. A pushover case has results in its direction of control alone;
-    /// nodes without results stay. 1 done; 0 Error says why, `out` as it was.
+    /// the end of the step, from 1. A pushover case of another solver has results in its direction
+    /// of control alone; nodes without results stay. 1 done; 0 Error says why, `out` as it was.
     [[nodiscard]] int Read(const T_SHAPE_SOURCE& source, int step,
                            std::vector<std::array<double, 3>>& out);
     /// Drifts of a step of a pushover load case; empty where there are none.
