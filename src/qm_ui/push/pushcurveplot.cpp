@@ -37,8 +37,9 @@ std::string NameOf(const T_PUSH_RUN& run, std::size_t hinge)
                kComponentNames[static_cast<std::size_t>(place.component)]);
 }
 
-/// Points at which hinges reach a letter of their curves for the first time.
-T_PLOT_SERIES Reached(const T_PUSH_RUN& run, const std::string& letter, const T_UNITS& units)
+/// Points at which hinges reach a letter of their curves for the first time; all, or the first.
+T_PLOT_SERIES Reached(const T_PUSH_RUN& run, const std::string& letter, bool all,
+                      const T_UNITS& units)
 {
     T_PLOT_SERIES s;
     std::set<std::size_t> reached;
@@ -47,6 +48,7 @@ T_PLOT_SERIES Reached(const T_PUSH_RUN& run, const std::string& letter, const T_
         for (const auto& turn : event.hinges)
             isNew = (turn.to == letter && reached.insert(turn.hinge).second) || isNew;
         if (!isNew || event.initial) continue;
+        if (!all && !s.x.empty()) break;
         s.x.push_back(DisplacementIn(run.direction, units).Shown(event.displacement));
         s.y.push_back(ReactionIn(run.direction, units).Shown(event.baseReaction));
     }
@@ -68,7 +70,7 @@ void AddEvents(T_PLOT& plot, std::span<const T_PUSH_RUN> runs, const T_UNITS& un
     for (const T_LETTER& l : kLetters) {
         bool named = false; // once in the legend
         for (const T_PUSH_RUN& run : runs) {
-            T_PLOT_SERIES s = Reached(run, l.letter, units);
+            T_PLOT_SERIES s = Reached(run, l.letter, runs.size() == 1, units);
             if (s.x.empty()) continue;
             if (!named) s.name = Say(l.key);
             named = true;
@@ -127,11 +129,10 @@ T_PLOT PushCurvePlot(std::span<const T_PUSH_RUN> runs, const T_UNITS& units,
     for (const T_PUSH_RUN& run : runs)
         plot.series.push_back(
             Curve(run.name, run.direction, units, run.displacement, run.baseReaction));
-    for (const T_PUSH_RUN& run : runs) {
-        T_PLOT_SERIES path = VertexPath(run, units);
-        if (path.x.empty()) continue;
-        if (plot.series.size() == runs.size()) path.name = Say("IDS_QM_PLOT_PUSH_PATH");
-        plot.series.push_back(std::move(path));
+    if (runs.size() == 1) {
+        T_PLOT_SERIES path = VertexPath(runs.front(), units);
+        path.name = Say("IDS_QM_PLOT_PUSH_PATH");
+        if (!path.x.empty()) plot.series.push_back(std::move(path));
     }
     AddEvents(plot, runs, units);
     if (runs.size() <= kMostNamed)
