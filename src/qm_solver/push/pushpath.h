@@ -127,7 +127,6 @@ private:
     T_FAULT Sync(std::size_t flow);
     T_FAULT SyncTouched();
     void NoteTurns(bool isEnd);
-    void Remember();
 
     CHingeBackbone& Backbone(std::size_t flow)
     {
@@ -198,7 +197,7 @@ private:
     double m_norm = 0.0;          // of the rates
     std::size_t m_sinceSum = 0;   // ways since the forces were summed up
     std::vector<double> m_before; // forces' rates of the last way, and that of the control
-    double m_beforeControl = 0.0;
+    double m_beforeControl = 0.0, m_beforeLeast = 0.0;
     T_PUSH_DRIVE m_drive;
     struct T_WAS {
         CHingeBackbone::ON on;

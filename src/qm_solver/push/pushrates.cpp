@@ -134,12 +134,12 @@ double CPushPath::DriveSign() const
     if (m_before.empty()) return m_rate.control >= 0.0 ? 1.0 : -1.0;
     sum = 0.0;
     double size = 0.0;
-    for (const CPushFlow& flow : m_flows.flows)
-        for (const std::size_t r : flow.Rows()) {
-            const double product = m_rate.force[r] * m_before[r] / (flow.force * flow.force);
-            sum += product;
-            size += std::fabs(product);
-        }
+    for (std::size_t r = 0; r < m_byForce.size(); ++r) {
+        if (std::fabs(m_before[r]) * m_byForce[r] <= m_beforeLeast) continue; // did not change
+        const double product = m_rate.force[r] * m_before[r] * m_byForce[r] * m_byForce[r];
+        sum += product;
+        size += std::fabs(product);
+    }
     if (size > 0.0 && std::fabs(sum) > kLeastRate * size) return sum > 0.0 ? 1.0 : -1.0;
     return m_rate.control * m_beforeControl >= 0.0 ? 1.0 : -1.0; // nothing resisted before
 }

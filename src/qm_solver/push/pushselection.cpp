@@ -241,17 +241,6 @@ void CPushPath::NoteTurns(bool isEnd)
     m_touched.clear();
 }
 
-/// Rates of this way, for what comes after: forces that do not change count as such.
-void CPushPath::Remember()
-{
-    const double least = Least();
-    m_before.assign(m_rate.force.size(), 0.0);
-    for (const CPushFlow& flow : m_flows.flows)
-        for (const std::size_t r : flow.Rows())
-            if (std::fabs(m_rate.force[r]) > least * flow.force) m_before[r] = m_rate.force[r];
-    m_beforeControl = m_rate.control;
-}
-
 CPushPath::WAY CPushPath::Select(T_FAULT& fault)
 {
     if ((fault = SyncTouched())) return WAY::Fault;
@@ -260,7 +249,9 @@ CPushPath::WAY CPushPath::Select(T_FAULT& fault)
         std::vector<T_CHANGE> changes = Violations();
         if (changes.empty()) {
             NoteTurns(false);
-            Remember();
+            m_before = m_rate.force;
+            m_beforeControl = m_rate.control;
+            m_beforeLeast = Least();
             return WAY::On;
         }
         if (round >= kTogether) { // the largest alone, so that a circle is left
