@@ -70,6 +70,33 @@ void CPushPath::MoveFlows(std::span<const double> unknowns, std::span<const doub
     }
 }
 
+void CPushPath::FindOpposites()
+{
+    const std::size_t none = m_flows.flows.size();
+    std::vector<std::size_t> first(m_structure.RowCount(), none);
+    m_opposite.assign(none, none);
+    for (std::size_t f = 0; f < none; ++f) {
+        if (m_flows.flows[f].Rows().size() != 1) continue;
+        std::size_t& before = first[m_flows.flows[f].Rows()[0]];
+        if (before == none) {
+            before = f;
+            continue;
+        }
+        m_opposite[f] = before;
+        m_opposite[before] = f;
+    }
+}
+
+/// By how much the row of a folded flow that is locked deforms more than its two sides have flowed.
+double CPushPath::Misfit(std::size_t f) const
+{
+    const CPushFlow& flow = m_flows.flows[f];
+    const std::size_t row = flow.Rows()[0], other = m_opposite[f];
+    const double whole = m_plastic[row] + m_soft[f] * m_force[row];
+    return (flow.positive ? whole : -whole) - Backbone(f).Flowed() +
+           (other < m_flows.flows.size() ? Backbone(other).Flowed() : 0.0);
+}
+
 bool CPushPath::WantsFold() const
 {
     if (m_active.size() < kMostActive) return false;

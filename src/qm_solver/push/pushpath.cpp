@@ -26,6 +26,7 @@ CPushPath::CPushPath(const T_PUSH_MODEL& model, CPushStructure& structure)
                              [](const CPushFlow& flow) { return flow.HangsOnAxial(); });
     m_soft.assign(m_flows.flows.size(), 0.0);
     m_lock.resize(m_flows.flows.size());
+    FindOpposites();
     for (std::size_t f = 0; f < m_lock.size(); ++f)
         UpdateLock(f);
     MakeRowScales();
@@ -94,7 +95,11 @@ CPushPath::T_FAULT CPushPath::Renew()
         for (std::size_t l = 0; l < m_structure.LoadCount(); ++l)
             w.byLoads.push_back(m_structure.Value(w.probe, m_structure.Loads(l).unknowns));
     }
+    std::vector<double> change = m_force;
     if (auto fault = Rebase()) return fault;
+    for (std::size_t r = 0; r < change.size(); ++r)
+        change[r] = m_force[r] - change[r];
+    MoveFlows(std::vector<double>(m_active.size(), 0.0), change, 1.0); // what is folded follows
     std::vector<std::size_t> rows;
     for (const std::size_t f : m_active)
         for (const T_FLOW_TERM& d : m_flows.flows[f].Direction(m_force, Resistance(f)))
@@ -318,8 +323,7 @@ CPushPath::T_FAULT CPushPath::Correct(std::optional<double> control)
         }
         for (std::size_t k = 0; k < m_active.size(); ++k) {
             const std::size_t f = m_active[k];
-            if (!IsMoving(f)) continue; // a folded one that is locked
-            right[k + 1] = Phi(f, Resistance(f));
+            right[k + 1] = IsMoving(f) ? Phi(f, Resistance(f)) : Misfit(f) / m_soft[f];
             worst = std::max(worst, std::fabs(right[k + 1]) / m_flows.flows[f].force);
         }
         if (worst <= (isSum ? kSettled : kKept)) return {};

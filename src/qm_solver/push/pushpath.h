@@ -151,6 +151,8 @@ private:
     /// Condition of an active flow: alpha rate of its force = beta rate of its unknown.
     double Alpha(std::size_t flow) const;
     double Beta(std::size_t flow) const;
+    void FindOpposites();
+    double Misfit(std::size_t flow) const;
     void MoveFlows(std::span<const double> unknowns, std::span<const double> forces, double by);
     void TakeDrive(std::span<const std::size_t> begun);
     double Least() const { return kLeastRate * m_norm; }
@@ -176,6 +178,7 @@ private:
     std::vector<double> m_factors;          // by set of loads
     std::vector<double> m_force, m_plastic; // plastic: beyond the springs of the structure
     std::vector<double> m_soft;             // by flow: compliance that the structure holds for it
+    std::vector<std::size_t> m_opposite;    // by flow: that of the other side, or their number
     std::vector<std::size_t> m_softFlows;   // those that have some
     struct T_BASE { // from displacements; what has changed since is summed up
         std::vector<double> factors, plastic, force, watch;

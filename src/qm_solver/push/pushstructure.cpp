@@ -135,7 +135,13 @@ CPushStructure::T_FAULT CPushStructure::Factorise(std::vector<double> tension)
 {
     if (tension.empty() && m_tension.empty() && !m_isSoft) return {};
     m_tension = std::move(tension);
-    return Refactorise();
+    if (auto fault = Refactorise()) return fault;
+    // What has yielded may well be unstable (its path falls); the elastic frame must stand.
+    const bool isElastic =
+        std::all_of(m_soft.begin(), m_soft.end(), [](double c) { return c == 0.0; });
+    if (isElastic && m_factor.Info().negativePivots > 0)
+        return Failed("IDS_QM_ENGINE_PUSH_BUCKLES");
+    return {};
 }
 
 CPushStructure::T_FAULT CPushStructure::Refactorise()
@@ -148,7 +154,6 @@ CPushStructure::T_FAULT CPushStructure::Refactorise()
     if (!m_factor.Factor(m_assembly.Matrix(), reason, PIVOTS::AsTheyAre)) return Failed(reason);
     m_isSoft = false;
     ++m_cost.factorisations;
-    if (m_factor.Info().negativePivots > 0) return Failed("IDS_QM_ENGINE_PUSH_BUCKLES");
     return {};
 }
 
