@@ -25,7 +25,9 @@ std::vector<double> StepsOfEvaluations(CDBDoc& doc, std::span<const T_PUSH_RUN> 
             continue;
         const T_PUSH_EVALUATION& result = evaluator.Result();
         const auto add = [&](double d) {
-            const double si = sign * std::fabs(ToSi(d, doc.Unit().Units(), kDimLength));
+            // an evaluation counts from the start of the push, a step is told by the whole
+            const double si = sign * std::fabs(ToSi(d, doc.Unit().Units(), kDimLength)) +
+                              runs.front().startDisplacement;
             if (si != 0.0 && IsOnTheWay(record, si)) out.push_back(si);
         };
         if (result.point) add(result.point->D);

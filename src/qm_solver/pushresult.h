@@ -88,6 +88,8 @@ struct T_PUSH_COST {
 struct T_PUSH_SINK {
     std::function<bool(const T_PUSH_STEP&)> step;   // false: cancel
     std::function<void(const T_PUSH_EVENT&)> event; // may be empty
+    /// State before the first step of a stage: load factor 0. May be empty.
+    std::function<void(const T_PUSH_STEP&)> start;
 };
 
 } // namespace solver

@@ -27,6 +27,12 @@ double CPushRecorder::BaseReaction(const T_DOF6& base) const
     return sum;
 }
 
+void CPushRecorder::Start(const solver::T_PUSH_STEP& step)
+{
+    m_data.start = step.nodes;
+    m_data.head.startReaction = BaseReaction(step.base);
+}
+
 void CPushRecorder::Add(const solver::T_PUSH_STEP& step)
 {
     std::vector<T_RUN_STATE> states;

@@ -15,6 +15,8 @@ public:
                   const solver::T_PUSH_MODEL& engine, std::span<const int> nodes,
                   std::span<const int> elements);
 
+    /// The state before the first step.
+    void Start(const solver::T_PUSH_STEP& step);
     void Add(const solver::T_PUSH_STEP& step);
     void Add(const solver::T_PUSH_EVENT& event);
     void End(const solver::T_PUSH_END& end);

@@ -28,6 +28,12 @@ public:
         out = m_data.hinges;
         return 1;
     }
+    int ReadStart(std::vector<T_DOF6>& out) override
+    {
+        out = m_data.start;
+        out.resize(m_data.nodes.size()); // none: at rest
+        return 1;
+    }
     int ReadNode(int node, std::vector<T_DOF6>& out) override
     {
         return Column(m_data.displacement, Find(node), m_data.nodes.size(), out);
@@ -99,18 +105,24 @@ int IPushRun::ReadLoadFactors(std::vector<double>& out)
 
 int IPushRun::ReadBaseReactions(std::vector<double>& out)
 {
-    return ReadOfSteps(&T_RUN_STEP::baseReaction, out);
+    if (!ReadOfSteps(&T_RUN_STEP::baseReaction, out)) return 0;
+    for (double& reaction : out)
+        reaction -= Head().startReaction;
+    return 1;
 }
 
 int IPushRun::ReadDisplacements(int node, std::vector<double>& out)
 {
-    std::vector<T_DOF6> all;
+    std::vector<T_DOF6> all, start;
     out.clear();
-    if (!ReadNode(node, all)) return 0;
+    const std::vector<int> nodes = NodeIds();
+    const auto at = std::ranges::lower_bound(nodes, node);
+    if (!ReadNode(node, all) || !ReadStart(start) || at == nodes.end() || *at != node) return 0;
+    const T_DOF6& before = start[static_cast<std::size_t>(at - nodes.begin())];
     for (const T_DOF6& u : all) {
         double along = 0.0;
         for (std::size_t i = 0; i < u.size(); ++i)
-            along += Head().control[i] * u[i];
+            along += Head().control[i] * (u[i] - before[i]);
         out.push_back(along);
     }
     return 1;
@@ -122,7 +134,8 @@ int ReadWholeRun(IPushRun& source, T_RUN_DATA& out, std::string& error)
     data.head = source.Head();
     data.nodes = source.NodeIds();
     bool ok = source.Error().empty() && source.ReadHinges(data.hinges) &&
-              source.ReadSteps(data.steps) && source.ReadEvents(data.events);
+              source.ReadSteps(data.steps) && source.ReadEvents(data.events) &&
+              source.ReadStart(data.start);
     for (int step = 1; ok && step <= source.StepCount(); ++step)
         ok = source.ReadShape(step, data.displacement.emplace_back()) &&
              source.ReadStates(step, data.states.emplace_back());

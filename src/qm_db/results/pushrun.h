@@ -73,9 +73,10 @@ struct T_RUN_END {
 
 /// What is known of a run without reading it.
 struct T_RUN_HEAD {
-    int turn = 0;       // k: the loads are turned about Z by k times the static angle
-    double angle = 0.0; // by so many degrees
-    T_DOF6 control{};   // unit vector of the control direction, global
+    int turn = 0;               // k: the loads are turned about Z by k times the static angle
+    double angle = 0.0;         // by so many degrees
+    T_DOF6 control{};           // unit vector of the control direction, global
+    double startReaction = 0.0; // base reaction before the first step
     T_RUN_PRINT print;
     T_RUN_END end;
     bool operator==(const T_RUN_HEAD&) const = default;
@@ -91,6 +92,7 @@ struct T_RUN_DATA {
     std::vector<std::vector<T_DOF6>> displacement;  // by step and node, global
     std::vector<std::vector<T_RUN_STATE>> states{}; // by step and hinge
     std::vector<T_RUN_EVENT> events{};
+    std::vector<T_DOF6> start{}; // by node: displacements before the first step
     bool operator==(const T_RUN_DATA&) const = default;
 };
 
@@ -105,6 +107,8 @@ public:
     [[nodiscard]] virtual int ReadSteps(std::vector<T_RUN_STEP>& out) = 0;
     [[nodiscard]] virtual int ReadEvents(std::vector<T_RUN_EVENT>& out) = 0;
     [[nodiscard]] virtual int ReadHinges(std::vector<T_RUN_HINGE>& out) = 0;
+    /// Displacements before the first step, by node (NodeIds).
+    [[nodiscard]] virtual int ReadStart(std::vector<T_DOF6>& out) = 0;
     /// Displacements of one node, by step; of all nodes (NodeIds) in one step, from 1.
     [[nodiscard]] virtual int ReadNode(int node, std::vector<T_DOF6>& out) = 0;
     [[nodiscard]] virtual int ReadShape(int step, std::vector<T_DOF6>& out) = 0;
@@ -112,7 +116,8 @@ public:
     [[nodiscard]] virtual int ReadHinge(std::size_t hinge, std::vector<T_RUN_STATE>& out) = 0;
     [[nodiscard]] virtual int ReadStates(int step, std::vector<T_RUN_STATE>& out) = 0;
 
-    // From the above: in the control direction.
+    // From the above: in the control direction, of the push alone, as an evaluation takes them:
+    // what stood before its first step is taken off.
     [[nodiscard]] int ReadLoadFactors(std::vector<double>& out) override;
     [[nodiscard]] int ReadBaseReactions(std::vector<double>& out) override;
     [[nodiscard]] int ReadDisplacements(int node, std::vector<double>& out) override;

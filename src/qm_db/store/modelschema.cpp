@@ -64,7 +64,8 @@ constexpr const char* kVersion5[] = {
     "control_y REAL NOT NULL, control_z REAL NOT NULL, control_rx REAL NOT NULL, "
     "control_ry REAL NOT NULL, control_rz REAL NOT NULL, nodes INTEGER NOT NULL, "
     "hinges INTEGER NOT NULL, steps INTEGER NOT NULL, events INTEGER NOT NULL, "
-    "turns INTEGER NOT NULL, outcome TEXT NOT NULL, end_stage INTEGER NOT NULL, "
+    "turns INTEGER NOT NULL, start_reaction REAL NOT NULL, outcome TEXT NOT NULL, end_stage "
+    "INTEGER NOT NULL, "
     "end_load_factor REAL NOT NULL, end_displacement REAL NOT NULL, "
     "end_element INTEGER NOT NULL, structure_print INTEGER NOT NULL, "
     "hinge_print INTEGER NOT NULL, load_print INTEGER NOT NULL, setup_print INTEGER NOT NULL, "
@@ -124,7 +125,7 @@ constexpr const char* kTables[] = {
     // nothing; step of a result of construction stages is its key in staged_results, from 1. Of
     // runs of a push, whose key in push_results stands in pushover: 9 node ids, 10 components of
     // hinges, 11 steps, 12 events, 13 turns of hinges in them; by step 14 displacements of 80
-    // nodes, 15 states of 128 components.
+    // nodes, 15 states of 128 components; 16 displacements of all nodes before the first step.
     "CREATE TABLE result_blocks(pushover INTEGER NOT NULL, part INTEGER NOT NULL, "
     "chunk INTEGER NOT NULL, step INTEGER NOT NULL, count INTEGER NOT NULL, "
     "width INTEGER NOT NULL, byte_order TEXT NOT NULL, checksum INTEGER NOT NULL, "

@@ -37,7 +37,8 @@ enum class BLOCK_PART {
     RunEvents,
     RunTurns,
     RunDisplacement,
-    RunState
+    RunState,
+    RunStart
 };
 
 struct T_BLOCK_KEY {

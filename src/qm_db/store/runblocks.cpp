@@ -66,6 +66,7 @@ constexpr T_REAL kReal[] = {
     {"control_rx", [](T_RUN_ROW& r) -> double& { return r.head.control[3]; }},
     {"control_ry", [](T_RUN_ROW& r) -> double& { return r.head.control[4]; }},
     {"control_rz", [](T_RUN_ROW& r) -> double& { return r.head.control[5]; }},
+    {"start_reaction", [](T_RUN_ROW& r) -> double& { return r.head.startReaction; }},
     {"end_load_factor", [](T_RUN_ROW& r) -> double& { return r.head.end.loadFactor; }},
     {"end_displacement", [](T_RUN_ROW& r) -> double& { return r.head.end.displacement; }},
 };
@@ -146,9 +147,11 @@ public:
         std::vector<T_RUN_HINGE> hinges;
         std::vector<T_RUN_EVENT> events;
         std::vector<T_RUN_TURN> turns;
+        std::vector<T_DOF6> start;
         const std::vector<int> nodes = m_source.NodeIds();
         if (!m_source.Error().empty() || !m_source.ReadSteps(steps) ||
-            !m_source.ReadHinges(hinges) || !m_source.ReadEvents(events))
+            !m_source.ReadHinges(hinges) || !m_source.ReadEvents(events) ||
+            !m_source.ReadStart(start))
             ThrowSource();
         for (const T_RUN_EVENT& e : events)
             turns.insert(turns.end(), e.turns.begin(), e.turns.end());
@@ -165,6 +168,7 @@ public:
         m_blocks.Write(RunKey(m_row, BLOCK_PART::RunTurns), Flat(ListOf(turns)));
         WriteBySteps(BLOCK_PART::RunDisplacement, &IPushRun::ReadShape);
         WriteBySteps(BLOCK_PART::RunState, &IPushRun::ReadStates);
+        WriteList(BLOCK_PART::RunStart, Flat(start));
     }
 
 private:

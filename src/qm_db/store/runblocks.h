@@ -27,14 +27,15 @@ struct T_RUN_PART {
     int bytes = 8; // of a number
     int block = 0; // things in a block of each step; 0: one block holds all
 };
-inline constexpr std::array<T_RUN_PART, 7> kRunParts{
+inline constexpr std::array<T_RUN_PART, 8> kRunParts{
     {{BLOCK_PART::RunNodes, &T_RUN_ROW::nodes, 1, 4},
      {BLOCK_PART::RunHinges, &T_RUN_ROW::hinges, 3},
      {BLOCK_PART::RunSteps, &T_RUN_ROW::steps, 12},
      {BLOCK_PART::RunEvents, &T_RUN_ROW::events, 11},
      {BLOCK_PART::RunTurns, &T_RUN_ROW::turns, 4, 4},
      {BLOCK_PART::RunDisplacement, &T_RUN_ROW::nodes, 6, 8, 80},
-     {BLOCK_PART::RunState, &T_RUN_ROW::hinges, 4, 8, 128}}};
+     {BLOCK_PART::RunState, &T_RUN_ROW::hinges, 4, 8, 128},
+     {BLOCK_PART::RunStart, &T_RUN_ROW::nodes, 6}}};
 
 constexpr const T_RUN_PART& RunPartOf(BLOCK_PART part)
 {

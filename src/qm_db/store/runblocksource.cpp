@@ -162,6 +162,15 @@ void CBlockPushRun::ForEachStep(BLOCK_PART partKey, int at, T_CHUNK& kept, const
         f(std::span(kept.values).subspan(from, width));
 }
 
+int CBlockPushRun::ReadStart(std::vector<T_DOF6>& out)
+{
+    return Guarded(out, [&] {
+        const std::vector<double> all = List<double>(BLOCK_PART::RunStart);
+        for (std::size_t at = 0; at < all.size(); at += std::tuple_size_v<T_DOF6>)
+            out.push_back(VectorAt(all, at));
+    });
+}
+
 int CBlockPushRun::ReadNode(int node, std::vector<T_DOF6>& out)
 {
     return Guarded(out, [&] {

@@ -23,6 +23,7 @@ public:
     [[nodiscard]] int ReadSteps(std::vector<T_RUN_STEP>& out) override;
     [[nodiscard]] int ReadEvents(std::vector<T_RUN_EVENT>& out) override;
     [[nodiscard]] int ReadHinges(std::vector<T_RUN_HINGE>& out) override;
+    [[nodiscard]] int ReadStart(std::vector<T_DOF6>& out) override;
     [[nodiscard]] int ReadNode(int node, std::vector<T_DOF6>& out) override;
     [[nodiscard]] int ReadShape(int step, std::vector<T_DOF6>& out) override;
     [[nodiscard]] int ReadHinge(std::size_t hinge, std::vector<T_RUN_STATE>& out) override;

@@ -17,6 +17,8 @@ public:
         std::ranges::copy(factors, m_factors.begin());
     }
     /// True: the step is one of the case.
+    /// The state before the first step of a stage.
+    void Start(const solver::T_PUSH_STEP& step);
     bool Take(const solver::T_PUSH_STEP& step);
     void Take(const solver::T_PUSH_EVENT& event);
     const T_PUSH_RUN& SoFar() const { return m_run; }

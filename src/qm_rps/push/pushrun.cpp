@@ -144,6 +144,7 @@ int CPushRun::RunCase(T_PREPARED& on, const T_PUSH_CASE& c, const PUSH_PROGRESS_
         return !progress || progress({c.name, so.loadFactor.size(), c.stages.back().steps.size(),
                                       so.displacement.back(), so.baseReaction.back()});
     };
+    sink.start = [&](const solver::T_PUSH_STEP& step) { collector.Start(step); };
     sink.event = [&](const solver::T_PUSH_EVENT& event) { collector.Take(event); };
     solver::T_PUSH_END end;
     solver::T_SOLVER_ERROR fault;
@@ -277,6 +278,11 @@ int CPushRun::Read(int key, int turn, T_PUSH_RUN& out, std::string& error)
     CPushCollector collector(m_model, m_frame, on->hinges, *c);
     const auto before = FactorsBefore(key);
     if (before) collector.SetFactorsBefore(*before);
+    solver::T_PUSH_STEP start;
+    start.stage = c->stages.size() - 1;
+    start.nodes = data.start;
+    start.nodes.resize(data.nodes.size());
+    collector.Start(start);
     for (std::size_t i = 0; i < data.steps.size(); ++i)
         (void)collector.Take(StepOf(data, i, on->hinges));
     for (const T_RUN_EVENT& event : data.events)

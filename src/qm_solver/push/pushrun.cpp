@@ -136,6 +136,7 @@ CPushRun::T_FAULT CPushRun::Stage(const T_PUSH_STAGE& stage, std::size_t number,
         }
     }
     if (auto fault = m_path->BeginStage(set, control)) return fault;
+    if (auto fault = GiveStart(number)) return fault;
     MakeTargets(stage);
     if (auto fault = Follow(stage, static_cast<int>(number), end)) return fault;
     end.stage = number;
@@ -158,6 +159,18 @@ void CPushRun::NoteEvent(const T_PUSH_STAGE& stage, int number)
         m_events.push_back(std::move(event));
     else if (m_sink.event)
         m_sink.event(event);
+}
+
+CPushRun::T_FAULT CPushRun::GiveStart(std::size_t number)
+{
+    if (!m_sink.start) return {};
+    const T_PUSH_STATE state = m_path->State();
+    T_PUSH_STEP step;
+    step.stage = number;
+    std::vector<double> tension;
+    if (auto fault = m_structure.Displace({&state, 1}, {&step, 1}, tension)) return fault;
+    m_sink.start(step);
+    return {};
 }
 
 /// P-Delta with the axial forces of this step: factorised again until they are those of the factor.

@@ -31,6 +31,7 @@ private:
     T_FAULT InitialPath(T_PUSH_END& end, bool& goesOn);
     T_FAULT Stage(const T_PUSH_STAGE& stage, std::size_t number, T_PUSH_END& end, bool& goesOn);
     T_FAULT Follow(const T_PUSH_STAGE& stage, int number, T_PUSH_END& end);
+    T_FAULT GiveStart(std::size_t number);
     void MakeTargets(const T_PUSH_STAGE& stage);
     double Present(const T_PUSH_STAGE& stage) const;
     double ToTarget(const T_PUSH_STAGE& stage) const;
