@@ -70,23 +70,23 @@ private:
         return shape;
     }
 
+    /// Mass times shape at every node. The masses of a storey stand at its nodes, so that the
+    /// pattern by storey masses is the same.
     int Mode(const T_POLC_PATTERN& row, solver::T_LOAD_CASE& to, std::string& error) const
     {
-        const bool byMass = row.kind == 3;
         const std::vector<T_VEC6> shape = Shape(row.number, error);
         if (shape.empty()) return 0;
         const std::vector<T_VEC3> mass = NodeMasses(m_frame.Frame());
         for (std::size_t i = 0; i < shape.size(); ++i) {
             T_VEC6 load{};
             for (std::size_t d = 0; d < 3; ++d)
-                if (!m_frame.Frame().nodes[i].fixed[d])
-                    load[d] = shape[i][d] * (byMass ? mass[i][d] : 1.0);
+                if (!m_frame.Frame().nodes[i].fixed[d]) load[d] = shape[i][d] * mass[i][d];
             if (std::ranges::any_of(load, [](double v) { return v != 0.0; }))
                 to.nodal.push_back({i, load});
         }
         const bool masses = std::ranges::any_of(
             mass, [](const T_VEC3& m) { return m[0] > 0.0 || m[1] > 0.0 || m[2] > 0.0; });
-        if (byMass && !masses) return Fail(error, Say("IDS_QM_PUSH_PATTERN_NO_MASS"));
+        if (!masses) return Fail(error, Say("IDS_QM_PUSH_PATTERN_NO_MASS"));
         return 1;
     }
 

@@ -34,6 +34,7 @@ CPushPath::CPushPath(const T_PUSH_MODEL& model, CPushStructure& structure)
         m_firstLaw.push_back(m_lawCount);
         m_lawCount += hinge.laws.size();
     }
+    m_told.assign(2 * m_lawCount, 0);
 }
 
 void CPushPath::MakeRowScales()

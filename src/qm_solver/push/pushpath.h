@@ -193,6 +193,7 @@ private:
     };
     std::vector<std::size_t> m_firstLaw; // by hinge: its first law of all
     std::size_t m_lawCount = 0;
+    std::vector<int> m_told;                      // by law and side: vertices that have been told
     std::vector<T_LOCK> m_lock;                   // by flow
     std::vector<double> m_byForce, m_byStiffness; // by row: rates over strengths
     std::vector<std::size_t> m_dropping;          // flows whose force falls at one deformation

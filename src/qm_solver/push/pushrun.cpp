@@ -28,6 +28,16 @@ bool Differ(std::span<const double> a, std::span<const double> b)
     return apart > kTensionKept * most;
 }
 
+/// The target, or a stop that was asked for: what follows starts from there.
+bool IsWanted(PUSH_OUTCOME outcome)
+{
+    constexpr PUSH_OUTCOME kWanted[] = {
+        PUSH_OUTCOME::Reached,       PUSH_OUTCOME::DriftStop, PUSH_OUTCOME::PeakFractionStop,
+        PUSH_OUTCOME::StiffnessStop, PUSH_OUTCOME::MarkStop,  PUSH_OUTCOME::StrengthLossStop,
+        PUSH_OUTCOME::LastPointStop};
+    return std::find(std::begin(kWanted), std::end(kWanted), outcome) != std::end(kWanted);
+}
+
 T_PUSH_STAGE InitialStage(const T_PUSH_MODEL& model)
 {
     T_PUSH_STAGE stage;
@@ -113,11 +123,12 @@ CPushRun::T_FAULT CPushRun::Stage(const T_PUSH_STAGE& stage, std::size_t number,
     const auto watch = [&](std::size_t node) {
         return m_path->Watch(m_structure.Displacement(node, direction));
     };
+    m_controlWatch = watch(stage.node);
     if (stage.control == PUSH_CONTROL::LargestTranslation)
         for (std::size_t n = 0; n < m_model.frame.nodes.size(); ++n)
             m_nodeWatch.push_back(watch(n));
     else
-        m_nodeWatch.push_back(watch(stage.node));
+        m_nodeWatch.push_back(m_controlWatch);
     for (const T_PUSH_DRIFT& drift : m_model.drifts) {
         const std::size_t top = watch(drift.node);
         m_driftWatch.push_back({top, drift.below == T_PUSH_DRIFT::kGround ? T_PUSH_DRIFT::kGround
@@ -140,7 +151,7 @@ CPushRun::T_FAULT CPushRun::Stage(const T_PUSH_STAGE& stage, std::size_t number,
     MakeTargets(stage);
     if (auto fault = Follow(stage, static_cast<int>(number), end)) return fault;
     end.stage = number;
-    goesOn = end.outcome == PUSH_OUTCOME::Reached;
+    goesOn = IsWanted(end.outcome);
     return {};
 }
 
@@ -304,13 +315,21 @@ CPushRun::T_FAULT CPushRun::Follow(const T_PUSH_STAGE& stage, int number, T_PUSH
         const double toEvent = m_path->NextEvent(), toTarget = ToTarget(stage),
                      toStop = number < 0 || isBehind ? CHingeBackbone::kFar : ToStop(stage, stop),
                      toReturn = isBehind ? ToReturn(stage) : CHingeBackbone::kFar;
-        const double by = std::min({toEvent, toTarget, toStop, toReturn});
+        std::size_t extra = 0;
+        const double toExtra = number < 0 || isBehind ? CHingeBackbone::kFar : ToExtra(extra);
+        const double by = std::min({toEvent, toTarget, toStop, toReturn, toExtra});
         if (!(by < CHingeBackbone::kFar)) return finish(PUSH_OUTCOME::NoPath);
         m_path->Advance(by);
         if (!isBehind) m_peak.reaction = std::max(m_peak.reaction, m_sign * Reaction(stage));
         if (!byLoad && m_sign * (Present(stage) - m_far) > 0.0) m_far = Present(stage);
         if (toReturn <= by) m_far = Present(stage);
-        if (toTarget <= by || toStop <= by) {
+        if (toExtra <= by && toTarget > by && toStop > by) {
+            m_extra.erase(m_extra.begin() + static_cast<long>(extra));
+            if ((fault = m_path->Correct(std::nullopt)) ||
+                (fault = Store(stage, number, true, end)))
+                return fault;
+            if (m_cancelled) return finish(end.outcome);
+        } else if (toTarget <= by || toStop <= by) {
             const bool onTarget = toTarget <= by;
             const std::optional<double> control =
                 onTarget && stage.control == PUSH_CONTROL::Displacement

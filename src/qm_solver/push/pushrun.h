@@ -36,8 +36,10 @@ private:
     double Present(const T_PUSH_STAGE& stage) const;
     double ToTarget(const T_PUSH_STAGE& stage) const;
     double ToStop(const T_PUSH_STAGE& stage, T_PUSH_END& end) const;
+    double ToExtra(std::size_t& found) const;
     double ToReturn(const T_PUSH_STAGE& stage) const;
     bool IsBehind(const T_PUSH_STAGE& stage) const;
+    bool StopsAtHinge(const T_PUSH_STOPS& stops, T_PUSH_END& end) const;
     bool StopsHere(const T_PUSH_STAGE& stage, T_PUSH_END& end);
     double Reaction(const T_PUSH_STAGE& stage) const;
     double ReactionRate(const T_PUSH_STAGE& stage) const;
@@ -55,6 +57,8 @@ private:
     std::array<std::size_t, 2> m_follows{}; // node and direction that the initial loads are told by
     std::vector<std::size_t> m_nodeWatch;   // translations in the direction of control
     std::vector<std::array<std::size_t, 2>> m_driftWatch;
+    std::size_t m_controlWatch = 0; // displacement of the control node
+    std::vector<double> m_extra;    // of it, where something else controls: further steps
     std::vector<T_TARGET> m_targets;
     std::size_t m_target = 0;
     double m_start = 0.0, m_sign = 1.0;

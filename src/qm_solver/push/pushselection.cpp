@@ -231,8 +231,11 @@ void CPushPath::NoteTurns(bool isEnd)
         const auto note = [&](HINGE_TURN turn, int point) {
             m_turned.push_back({flow.hinge, flow.law, turn, point, flow.positive});
         };
-        for (int v = was.vertex + 1; v <= now.Vertex(); ++v)
+        // Faces of a biaxial hinge follow one law: a vertex is told once.
+        int& told = m_told[2 * (m_firstLaw[flow.hinge] + flow.law) + (flow.positive ? 0 : 1)];
+        for (int v = std::max(told, was.vertex) + 1; v <= now.Vertex(); ++v)
             note(HINGE_TURN::Point, v);
+        told = std::max(told, now.Vertex());
         if (isEnd || now.Vertex() != was.vertex) continue;
         const bool wasOn = was.on == ON::Virgin, isOn = now.On() == ON::Virgin;
         if (wasOn && !isOn && now.On() != ON::Drop) note(HINGE_TURN::Unload, now.Vertex());

@@ -38,8 +38,12 @@ void CPushRun::MakeTargets(const T_PUSH_STAGE& stage)
     for (const double fraction : stage.steps)
         m_targets.push_back({fraction == 1.0 ? stage.target : m_start + fraction * way, false});
     if (m_targets.empty()) m_targets.push_back({stage.target, false});
-    for (const double value : stage.additional)
-        m_targets.push_back({value, true});
+    m_extra.clear();
+    if (stage.control == PUSH_CONTROL::Displacement)
+        for (const double value : stage.additional)
+            m_targets.push_back({value, true});
+    else
+        m_extra = stage.additional;
     const auto before = [&](const T_TARGET& a, const T_TARGET& b) {
         return m_sign * a.value < m_sign * b.value;
     };
@@ -88,6 +92,22 @@ bool CPushRun::IsBehind(const T_PUSH_STAGE& stage) const
     if (stage.control == PUSH_CONTROL::LoadFactor) return false;
     return m_sign * m_path->Rate().control < 0.0 ||
            m_sign * (m_far - Present(stage)) > kOnTarget * std::fabs(stage.target - m_start);
+}
+
+/// Along the rates, to the next of the displacements of the control node that are steps although
+/// something else controls; `found` is its place.
+double CPushRun::ToExtra(std::size_t& found) const
+{
+    double first = CHingeBackbone::kFar;
+    if (m_extra.empty()) return first;
+    const double at = m_path->Watched(m_controlWatch), rate = m_path->WatchRate(m_controlWatch);
+    for (std::size_t k = 0; k < m_extra.size(); ++k) {
+        const double by = (m_extra[k] - at) / rate;
+        if (rate == 0.0 || !(by >= 0.0) || by >= first) continue;
+        first = by;
+        found = k;
+    }
+    return first;
 }
 
 double CPushRun::Reaction(const T_PUSH_STAGE& stage) const
@@ -159,9 +179,28 @@ double CPushRun::ToStop(const T_PUSH_STAGE& stage, T_PUSH_END& end) const
     return first;
 }
 
+/// A hinge that begins to lose its strength, or came beyond its last vertex: at once, wherever the
+/// path goes from there.
+bool CPushRun::StopsAtHinge(const T_PUSH_STOPS& stops, T_PUSH_END& end) const
+{
+    if (!stops.strengthLoss && !stops.lastPoint) return false;
+    for (const CPushFlow& flow : m_path->Flows().flows) {
+        const CHingeBackbone& backbone = m_path->Flows().backbones[flow.backbone];
+        const bool lost = stops.strengthLoss && backbone.LosesStrength();
+        const bool beyond = stops.lastPoint && backbone.VertexCount() > 1 &&
+                            backbone.Vertex() >= backbone.VertexCount();
+        if (!lost && !beyond) continue;
+        end.outcome = lost ? PUSH_OUTCOME::StrengthLossStop : PUSH_OUTCOME::LastPointStop;
+        end.hinge = static_cast<long>(flow.hinge);
+        return true;
+    }
+    return false;
+}
+
 /// Stops that a change of direction brings, and those of hinges that have just turned.
 bool CPushRun::StopsHere(const T_PUSH_STAGE& stage, T_PUSH_END& end)
 {
+    if (StopsAtHinge(stage.stops, end)) return true;
     if (IsBehind(stage)) return false;
     const T_PUSH_STOPS& stops = stage.stops;
     const double moved = m_path->WatchRate(m_nodeWatch[0]);
@@ -174,17 +213,6 @@ bool CPushRun::StopsHere(const T_PUSH_STAGE& stage, T_PUSH_END& end)
             end.outcome = PUSH_OUTCOME::StiffnessStop;
             return true;
         }
-    }
-    if (!stops.strengthLoss && !stops.lastPoint) return false;
-    for (const CPushFlow& flow : m_path->Flows().flows) {
-        const CHingeBackbone& backbone = m_path->Flows().backbones[flow.backbone];
-        const bool lost = stops.strengthLoss && backbone.LosesStrength();
-        const bool beyond = stops.lastPoint && backbone.VertexCount() > 1 &&
-                            backbone.Vertex() >= backbone.VertexCount();
-        if (!lost && !beyond) continue;
-        end.outcome = lost ? PUSH_OUTCOME::StrengthLossStop : PUSH_OUTCOME::LastPointStop;
-        end.hinge = static_cast<long>(flow.hinge);
-        return true;
     }
     return false;
 }

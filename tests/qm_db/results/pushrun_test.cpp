@@ -20,10 +20,13 @@ using H = solver::HINGE_TURN;
 T_RUN_DATA LongRun(int steps)
 {
     T_RUN_DATA run;
-    run.head = {0, 0.0, {0, 0, 0, 0, 0, 0}, {1, 2, 3, ~0ULL}, {O::SnapBack, 1, -0.0, 0.25, 7}};
+    run.head = {
+        0, 0.0, {0, 0, 0, 0, 0, 0}, -3.5, {1, 2, 3, ~0ULL}, {O::SnapBack, 1, -0.0, 0.25, 7}};
     run.head.control[1] = 1.0;
-    for (int n = 1; n <= 170; ++n)
+    for (int n = 1; n <= 170; ++n) {
         run.nodes.push_back(10 * n);
+        run.start.push_back({0, 0.125 * n, -1.0 * n, 0, 0, 0});
+    }
     for (int h = 0; h < 140; ++h)
         run.hinges.push_back({h / 2 + 1, 0.5 * (h % 3), h % 6});
     for (int s = 1; s <= steps; ++s) {
