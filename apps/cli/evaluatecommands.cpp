@@ -4,6 +4,7 @@
 #include "output.h"
 #include "push/pushfirst.h"
 #include "qm_base/say.h"
+#include "qm_rps/push/pushatpointtext.h"
 #include "qm_rps/pushover/evaluation/pushovercomparison.h"
 #include "qm_rps/pushover/report/pushoverreport.h"
 #include "qm_rps/pushovercalculators.h"
@@ -159,11 +160,19 @@ EXIT_CODE WritePlots(const std::string& path, const std::vector<T_PUSH_EVALUATIO
 
 /// Reports of several evaluations follow one another in one file.
 EXIT_CODE WriteReports(const std::string& path, const std::vector<T_PUSH_EVALUATION>& results,
-                       std::string (*print)(const T_PUSH_EVALUATION&))
+                       const std::vector<T_HINGES_AT>& hinges)
+{
+    std::string text;
+    for (std::size_t i = 0; i < results.size(); ++i)
+        text += PushoverReportText(results[i]) + HingesAtReport(hinges[i]);
+    return WriteOutput(path, text);
+}
+
+EXIT_CODE WriteCurves(const std::string& path, const std::vector<T_PUSH_EVALUATION>& results)
 {
     std::string text;
     for (const T_PUSH_EVALUATION& e : results)
-        text += print(e);
+        text += PushoverCurveText(e);
     return WriteOutput(path, text);
 }
 
@@ -176,16 +185,26 @@ void StoreSteps(CDBDoc& doc)
         Complain(EXIT_CODE::Done, Say("IDS_QM_CLI_STEPS_NOT_STORED", error.text));
 }
 
-EXIT_CODE WriteResults(const T_EVALUATE_OPTIONS& o, const std::vector<T_PUSH_EVALUATION>& results)
+EXIT_CODE WriteResults(const T_EVALUATE_OPTIONS& o, const std::vector<T_PUSH_EVALUATION>& results,
+                       const std::vector<T_HINGES_AT>& hinges)
 {
     EXIT_CODE code = EXIT_CODE::Done;
     const auto ok = [&] { return code == EXIT_CODE::Done; };
-    if (!o.json.empty()) code = WriteOutput(o.json, ResultJson(results));
-    if (ok() && !o.report.empty()) code = WriteReports(o.report, results, PushoverReportText);
-    if (ok() && !o.curve.empty()) code = WriteReports(o.curve, results, PushoverCurveText);
+    if (!o.json.empty()) code = WriteOutput(o.json, ResultJson(results, hinges));
+    if (ok() && !o.report.empty()) code = WriteReports(o.report, results, hinges);
+    if (ok() && !o.curve.empty()) code = WriteCurves(o.curve, results);
     if (ok() && !o.plot.empty()) code = WritePlots(o.plot, results, false);
     if (ok() && !o.plotDemand.empty()) code = WritePlots(o.plotDemand, results, true);
     return code;
+}
+
+void PrintTables(const std::vector<T_PUSH_EVALUATION>& results,
+                 const std::vector<T_HINGES_AT>& hinges)
+{
+    std::string text = ResultTable(results);
+    for (const T_HINGES_AT& at : hinges)
+        text += HingesAtTable(at);
+    std::fwrite(text.data(), 1, text.size(), stdout);
 }
 
 } // namespace
@@ -238,8 +257,10 @@ EXIT_CODE RunEvaluate(const T_EVALUATE_OPTIONS& o)
     bool extras = true;
     if (const EXIT_CODE code = EvaluateAll(doc, o, results, extras); code != EXIT_CODE::Done)
         return code;
-    if (const EXIT_CODE code = WriteResults(o, results); code != EXIT_CODE::Done) return code;
-    if (o.json != "-") std::printf("%s", ResultTable(results).c_str());
+    const std::vector<T_HINGES_AT> hinges = HingesAtPoints(doc, results);
+    if (const EXIT_CODE code = WriteResults(o, results, hinges); code != EXIT_CODE::Done)
+        return code;
+    if (o.json != "-") PrintTables(results, hinges);
     if (o.trace && o.json != "-") {
         for (const T_PUSH_EVALUATION& e : results)
             std::printf("%s", TraceTable(e).c_str());

@@ -1,8 +1,105 @@
 #include "qm_rps/evaluatedsteps.h"
 
+#include "qm_base/say.h"
 #include "qm_rps/pushovercalculators.h"
 
+#include <algorithm>
 #include <cmath>
+#include <map>
+
+namespace {
+
+constexpr int kByDisplacement = 1; // T_POLC_CONTROL::incrementMethod
+
+/// Curves are drawn to the right whichever way the structure is pushed.
+double SignOf(const T_POLC_D& record)
+{
+    const bool back =
+        record.control && record.control->masterNodeControl && record.control->masterMaxDispl < 0.0;
+    return back ? -1.0 : 1.0;
+}
+
+std::vector<T_PUSH_POINT> PointsOf(const T_PUSH_EVALUATION& e, double sign)
+{
+    std::vector<T_PUSH_POINT> out;
+    const auto add = [&](PUSH_POINT kind, const std::string& state, std::optional<double> d) {
+        if (!d || *d == 0.0 || !std::isfinite(*d)) return;
+        out.push_back({kind, state, sign * std::fabs(ToSi(*d, e.units, kDimLength))});
+    };
+    if (e.point) add(PUSH_POINT::Performance, {}, e.point->D);
+    for (const T_LIMIT_ROW& row : e.limitStates) {
+        add(PUSH_POINT::Demand, row.name, row.demand);
+        if (!e.elastic) add(PUSH_POINT::Capacity, row.name, row.capacity);
+    }
+    return out;
+}
+
+/// Why a load case is not pushed to displacements; empty: it is.
+std::string WhyNotPushed(const T_POLC_D& record)
+{
+    constexpr int kFirstRotation = 4;
+    if (record.direction >= kFirstRotation) return Say("IDS_QM_PUSH_AT_TURN");
+    const bool many = record.control && record.control->generateStaticAngle;
+    return many ? Say("IDS_QM_PUSH_AT_DIRECTIONS") : std::string();
+}
+
+/// Displacements that the engine can be asked for; of a push by load it takes none.
+std::vector<double> StepsAt(const T_POLC_D& record, const std::vector<T_PUSH_POINT>& points)
+{
+    std::vector<double> out;
+    if (!record.control || record.control->incrementMethod != kByDisplacement) return out;
+    for (const T_PUSH_POINT& point : points)
+        if (IsOnTheWay(record, point.displacement)) out.push_back(point.displacement);
+    return out;
+}
+
+/// Pushes a load case to the points of its evaluations, and shares these out.
+void PushToPoints(CPushRun& push, int key, const T_POLC_D& record,
+                  const std::map<T_HINGES_AT*, std::vector<T_PUSH_POINT>>& wanted,
+                  const PUSH_PROGRESS_FN& progress)
+{
+    std::vector<T_PUSH_POINT> all;
+    for (const auto& [to, points] : wanted)
+        all.insert(all.end(), points.begin(), points.end());
+    std::vector<T_PUSH_RUN> runs;
+    std::string note = WhyNotPushed(record), error;
+    if (note.empty() && !push.Run(key, progress, runs, error, StepsAt(record, all)))
+        note = error;
+    else if (note.empty() && runs.front().cancelled)
+        note = Say("IDS_QM_PUSH_AT_INTERRUPTED");
+    for (const auto& [to, points] : wanted) {
+        to->note = note;
+        if (note.empty()) to->points = PushAtPoints(runs.front(), points);
+    }
+}
+
+} // namespace
+
+std::vector<T_HINGES_AT> HingesOfEvaluations(CDBDoc& doc,
+                                             std::span<const T_PUSH_EVALUATION> results,
+                                             const PUSH_PROGRESS_FN& progress)
+{
+    std::vector<T_HINGES_AT> out(results.size());
+    std::map<int, std::map<T_HINGES_AT*, std::vector<T_PUSH_POINT>>> wanted; // by load case
+    for (std::size_t i = 0; i < results.size(); ++i) {
+        const T_PUSH_EVALUATION& e = results[i];
+        int key = 0;
+        std::string old;
+        if (!doc.Attr().FindPolc(e.eval.push, key) || !doc.Post().RunOf(key) ||
+            doc.Post().IsStale(key, old))
+            continue;
+        out[i].evaluation = e.eval.name;
+        out[i].push = e.eval.push;
+        out[i].units = e.units;
+        std::vector<T_PUSH_POINT> points =
+            PointsOf(e, SignOf(doc.Data().Model().pushovers.at(key)));
+        if (!points.empty()) wanted[key][&out[i]] = std::move(points);
+    }
+    CPushRun push(doc);
+    for (const auto& [key, of] : wanted)
+        PushToPoints(push, key, doc.Data().Model().pushovers.at(key), of, progress);
+    return out;
+}
 
 std::vector<double> StepsOfEvaluations(CDBDoc& doc, std::span<const T_PUSH_RUN> runs)
 {
@@ -10,10 +107,7 @@ std::vector<double> StepsOfEvaluations(CDBDoc& doc, std::span<const T_PUSH_RUN> 
     const T_POLC_D record = doc.Data().Model().pushovers.at(runs.front().key);
     if (!record.additionalEvaluations) return {};
     std::vector<double> out;
-    const double sign =
-        record.control && record.control->masterNodeControl && record.control->masterMaxDispl < 0.0
-            ? -1.0
-            : 1.0;
+    const double sign = SignOf(record);
     CPushEvaluator evaluator(doc, RunPerfPtProcedure);
     evaluator.SetStoreSteps(false);
     evaluator.SetFindAllPoints(false);

@@ -1,7 +1,8 @@
 // Steps of a push at what its evaluations find.
 #pragma once
 
-#include "qm_rps/push/pushrun.h"
+#include "qm_rps/push/pushatpoint.h"
+#include "qm_rps/pushover/pushevaluation.h"
 
 #include <span>
 
@@ -9,3 +10,11 @@
 /// of a load case, to be steps of its push; its results must be those of the document. Empty where
 /// the load case does not ask for them, was cancelled, or was pushed in several directions.
 std::vector<double> StepsOfEvaluations(CDBDoc& doc, std::span<const T_PUSH_RUN> runs);
+
+/// What every hinge does at what the evaluations found: at performance points, and at the demands
+/// and capacities of limit states. Each load case whose results are of our own and not older than
+/// the model is pushed again, once, with these displacements as steps; the document stays as it is.
+/// One entry per evaluation, without points where its push is of another program.
+std::vector<T_HINGES_AT> HingesOfEvaluations(CDBDoc& doc,
+                                             std::span<const T_PUSH_EVALUATION> results,
+                                             const PUSH_PROGRESS_FN& progress);

@@ -1,7 +1,5 @@
 #include "json/pushjson.h"
 
-#include "json/jsontext.h"
-
 #include <algorithm>
 
 namespace {
@@ -60,17 +58,6 @@ private:
         m_w.End();
     }
 
-    /// A number where the place is an integration point.
-    void Place(const T_PUSH_LAW_PLACE& place)
-    {
-        m_w.Member("element", place.element);
-        if (std::ranges::all_of(place.end, [](char c) { return c >= '0' && c <= '9'; }))
-            m_w.Member("end", std::stoi(place.end));
-        else
-            m_w.Member("end", place.end);
-        m_w.Member("component", kComponentNames[static_cast<std::size_t>(place.component)]);
-    }
-
     void WriteEvents(const T_PUSH_RUN& run, T_DIM displacement, T_DIM force)
     {
         m_w.Key("events").List(kRows);
@@ -83,7 +70,7 @@ private:
             m_w.Key("hinges").List(kJsonOneLine);
             for (const auto& turn : event.hinges) {
                 m_w.Object(kJsonOneLine);
-                Place(run.hinges[turn.hinge].place);
+                WritePlace(m_w, run.hinges[turn.hinge].place);
                 m_w.Member("to", turn.to);
                 m_w.End();
             }
@@ -97,7 +84,7 @@ private:
     {
         const bool moment = hinge.place.component >= HINGE_COMPONENT::Mx;
         m_w.Object(kJsonOneLine);
-        Place(hinge.place);
+        WritePlace(m_w, hinge.place);
         Series("deformation", hinge.deformation, moment ? kDimNone : kDimLength);
         Series("force", hinge.force, StrengthDim(hinge.place.component));
         m_w.Key("state").List(kJsonOneLine);
@@ -139,6 +126,16 @@ private:
 };
 
 } // namespace
+
+void WritePlace(CJsonText& w, const T_PUSH_LAW_PLACE& place)
+{
+    w.Member("element", place.element);
+    if (std::ranges::all_of(place.end, [](char c) { return c >= '0' && c <= '9'; }))
+        w.Member("end", std::stoi(place.end));
+    else
+        w.Member("end", place.end);
+    w.Member("component", kComponentNames[static_cast<std::size_t>(place.component)]);
+}
 
 std::string PushJson(const std::vector<T_PUSH_RUN>& runs, const std::set<int>& nodes,
                      const T_UNITS& units)

@@ -2,6 +2,7 @@
 
 #include "qm_rps/pushover/fema440coefficients.h"
 #include "qm_rps/pushover/report/pushovercells.h"
+#include "json/hingesatjson.h"
 
 namespace {
 
@@ -191,7 +192,7 @@ void WriteCurve(CJsonText& w, const T_PLOTTED_CURVE& c)
     w.End();
 }
 
-void Write(CJsonText& w, const T_PUSH_EVALUATION& e)
+void Write(CJsonText& w, const T_PUSH_EVALUATION& e, const T_HINGES_AT* hinges)
 {
     w.Object();
     w.Member("name", e.eval.name).Member("push", e.eval.push);
@@ -218,6 +219,7 @@ void Write(CJsonText& w, const T_PUSH_EVALUATION& e)
     if (e.IsTarget()) WriteDerivation(w, e);
     w.Member("trials", e.trace.size());
     WriteList(w, "trace", e.trace);
+    if (hinges) WriteHingesAt(w, *hinges);
     w.End();
 }
 
@@ -229,17 +231,19 @@ const char* StatusName(int result)
     return kStatus[result];
 }
 
-void WriteResults(CJsonText& w, const std::vector<T_PUSH_EVALUATION>& results)
+void WriteResults(CJsonText& w, const std::vector<T_PUSH_EVALUATION>& results,
+                  const std::vector<T_HINGES_AT>& hinges)
 {
     w.List();
-    for (const T_PUSH_EVALUATION& e : results)
-        Write(w, e);
+    for (std::size_t i = 0; i < results.size(); ++i)
+        Write(w, results[i], i < hinges.size() ? &hinges[i] : nullptr);
     w.End();
 }
 
-std::string ResultJson(const std::vector<T_PUSH_EVALUATION>& results)
+std::string ResultJson(const std::vector<T_PUSH_EVALUATION>& results,
+                       const std::vector<T_HINGES_AT>& hinges)
 {
     CJsonText w(JSON_REALS::WithPoint);
-    WriteResults(w, results);
+    WriteResults(w, results, hinges);
     return w.Text();
 }

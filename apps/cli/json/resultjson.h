@@ -1,6 +1,7 @@
 // Results of evaluations as JSON: a list with one object per evaluation.
 #pragma once
 
+#include "qm_rps/push/pushatpoint.h"
 #include "qm_rps/pushover/pushevaluation.h"
 #include "json/jsontext.h"
 
@@ -8,10 +9,13 @@
 #include <vector>
 
 /// The list as the next value. What does not exist is null.
-void WriteResults(CJsonText& writer, const std::vector<T_PUSH_EVALUATION>& results);
+void WriteResults(CJsonText& writer, const std::vector<T_PUSH_EVALUATION>& results,
+                  const std::vector<T_HINGES_AT>& hinges = {});
 
 /// The list as a text of its own. Numbers print shortest round trip; ends with a line end.
-std::string ResultJson(const std::vector<T_PUSH_EVALUATION>& results);
+/// hinges: what the hinges do at the points of each evaluation, as many as results, or empty.
+std::string ResultJson(const std::vector<T_PUSH_EVALUATION>& results,
+                       const std::vector<T_HINGES_AT>& hinges = {});
 
 /// "not found", "found" or "elastic", for the status of a result.
 const char* StatusName(int result);

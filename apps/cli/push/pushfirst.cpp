@@ -4,7 +4,6 @@
 #include "output.h"
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
-#include "qm_rps/evaluatedsteps.h"
 
 #include <cstdio>
 #include <unistd.h>
@@ -80,4 +79,12 @@ EXIT_CODE PushWhereMissing(CDBDoc& doc, const std::string& file, const std::set<
     }
     std::vector<T_PUSH_RUN> runs;
     return PushCases(doc, file, missing, runs);
+}
+
+std::vector<T_HINGES_AT> HingesAtPoints(CDBDoc& doc, const std::vector<T_PUSH_EVALUATION>& results)
+{
+    const CInterrupt interrupt;
+    const T_UNITS units = doc.Unit().Units();
+    return HingesOfEvaluations(doc, results,
+                               [&](const T_PUSH_PROGRESS& p) { return ShowStep(p, units); });
 }

@@ -2,7 +2,7 @@
 #pragma once
 
 #include "exitcodes.h"
-#include "qm_rps/push/pushrun.h"
+#include "qm_rps/evaluatedsteps.h"
 
 #include <set>
 
@@ -16,3 +16,7 @@ EXIT_CODE PushCases(CDBDoc& doc, const std::string& file, const std::vector<int>
 /// Pushes those that have no results, or old ones of our own, and says so. A case without control
 /// data stays without.
 EXIT_CODE PushWhereMissing(CDBDoc& doc, const std::string& file, const std::set<int>& keys);
+
+/// What the hinges do at the points of these evaluations, with progress on a terminal; Ctrl-C ends
+/// it, the evaluations stand.
+std::vector<T_HINGES_AT> HingesAtPoints(CDBDoc& doc, const std::vector<T_PUSH_EVALUATION>& results);

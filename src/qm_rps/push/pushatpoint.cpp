@@ -1,0 +1,84 @@
+#include "qm_rps/push/pushatpoint.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace {
+
+constexpr double kSame = 1e-9; // of the largest displacement of the run
+
+constexpr std::size_t kCp = 2; // of the marks IO, LS, CP
+
+/// Deformation that the ratio of a component counts in, a magnitude; empty: there is none.
+std::optional<double> LimitOf(const T_PUSH_HINGE_SERIES& hinge, double deformation)
+{
+    const bool negative = deformation < 0.0;
+    const solver::T_HINGE_SIDE& side = negative ? hinge.law.negative : hinge.law.positive;
+    const T_PUSH_LAW_PLACE& place = hinge.place;
+    std::optional<double> limit;
+    if (place.criteria) {
+        if (side.marks.size() > kCp) limit = side.marks[kCp];
+    } else {
+        const std::size_t c = (negative ? place.letters.neg : place.letters.pos).find('C');
+        if (c < side.points.size()) limit = side.points[c].deformation;
+    }
+    return limit && *limit > 0.0 ? limit : std::nullopt;
+}
+
+/// Larger ratios first, then those without one, the further state first.
+bool IsWorse(const T_HINGE_AT_POINT& a, const T_HINGE_AT_POINT& b)
+{
+    if (a.ratio.has_value() != b.ratio.has_value()) return a.ratio.has_value();
+    if (a.ratio && *a.ratio != *b.ratio) return *a.ratio > *b.ratio;
+    return a.state > b.state;
+}
+
+void TakeStep(const T_PUSH_RUN& run, std::size_t step, T_PUSH_AT_POINT& to)
+{
+    to.found = AT_POINT::Reached;
+    to.loadFactor = run.loadFactor[step];
+    for (const T_PUSH_HINGE_SERIES& hinge : run.hinges) {
+        const PUSH_STATE state = hinge.state[step];
+        ++to.states[static_cast<std::size_t>(state)];
+        if (state == PUSH_STATE::Elastic) continue;
+        T_HINGE_AT_POINT at{hinge.place, hinge.deformation[step], hinge.force[step], state, {}};
+        if (const auto limit = LimitOf(hinge, at.deformation))
+            at.ratio = std::fabs(at.deformation) / *limit;
+        to.worst.push_back(std::move(at));
+    }
+    std::ranges::stable_sort(to.worst, IsWorse);
+    if (to.worst.size() > kMostWorst) to.worst.resize(kMostWorst);
+    for (const T_PUSH_STOREY_SERIES& storey : run.storeys) {
+        T_STOREY_AT_POINT at{storey.name, storey.displacement[step], storey.drift[step], {}};
+        if (!storey.shear.empty()) at.shear = storey.shear[step];
+        to.storeys.push_back(std::move(at));
+    }
+}
+
+} // namespace
+
+const char* RatioOf(const T_PUSH_LAW_PLACE& place)
+{
+    return place.criteria ? "CP" : "C";
+}
+
+std::vector<T_PUSH_AT_POINT> PushAtPoints(const T_PUSH_RUN& run,
+                                          const std::vector<T_PUSH_POINT>& points)
+{
+    double furthest = 0.0;
+    for (const double d : run.displacement)
+        furthest = std::max(furthest, std::fabs(d));
+    std::vector<T_PUSH_AT_POINT> out;
+    for (const T_PUSH_POINT& point : points) {
+        T_PUSH_AT_POINT& at = out.emplace_back();
+        at.point = point;
+        const auto step = std::ranges::find_if(run.displacement, [&](double d) {
+            return std::fabs(d - point.displacement) <= kSame * furthest;
+        });
+        if (step != run.displacement.end())
+            TakeStep(run, static_cast<std::size_t>(step - run.displacement.begin()), at);
+        else if (std::fabs(point.displacement) <= furthest)
+            at.found = AT_POINT::NoStep;
+    }
+    return out;
+}
