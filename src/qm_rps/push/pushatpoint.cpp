@@ -25,9 +25,16 @@ std::optional<double> LimitOf(const T_PUSH_HINGE_SERIES& hinge, double deformati
     return limit && *limit > 0.0 ? limit : std::nullopt;
 }
 
-/// Larger ratios first, then those without one, the further state first.
+/// Beyond C a component has lost strength, although CP of a secondary member may lie further.
+bool HasLost(PUSH_STATE state)
+{
+    return state >= PUSH_STATE::CtoD;
+}
+
+/// Those that have lost strength, then larger ratios, then those without one by their state.
 bool IsWorse(const T_HINGE_AT_POINT& a, const T_HINGE_AT_POINT& b)
 {
+    if (HasLost(a.state) != HasLost(b.state)) return HasLost(a.state);
     if (a.ratio.has_value() != b.ratio.has_value()) return a.ratio.has_value();
     if (a.ratio && *a.ratio != *b.ratio) return *a.ratio > *b.ratio;
     return a.state > b.state;

@@ -38,7 +38,8 @@ struct T_PUSH_AT_POINT {
     AT_POINT found = AT_POINT::Beyond; // what follows is of a point that was reached
     double loadFactor = 0.0;
     std::array<std::size_t, kPushStateNames.size()> states{}; // components by state
-    std::vector<T_HINGE_AT_POINT> worst; // by falling ratio, at most kMostWorst; none is elastic
+    /// At most kMostWorst, none is elastic: those beyond C, then by falling ratio.
+    std::vector<T_HINGE_AT_POINT> worst;
     std::vector<T_STOREY_AT_POINT> storeys;
 };
 inline constexpr std::size_t kMostWorst = 10;
