@@ -19,12 +19,29 @@ double SignOf(const T_POLC_D& record)
     return back ? -1.0 : 1.0;
 }
 
-std::vector<T_PUSH_POINT> PointsOf(const T_PUSH_EVALUATION& e, double sign)
+/// Displacement of the control node before the first step of a stored run (m): an evaluation counts
+/// from there, a step is told by the whole.
+double StartOf(CDBDoc& doc, int key)
+{
+    IPushRun* const run = doc.Post().RunOf(key);
+    std::vector<T_DOF6> start;
+    if (!run || !run->ReadStart(start)) return 0.0;
+    const std::vector<int> nodes = run->NodeIds();
+    const auto at =
+        std::ranges::lower_bound(nodes, doc.Data().Model().pushovers.at(key).controlNode);
+    if (at == nodes.end()) return 0.0;
+    double along = 0.0;
+    for (std::size_t d = 0; d < 6; ++d)
+        along += run->Head().control[d] * start[static_cast<std::size_t>(at - nodes.begin())][d];
+    return along;
+}
+
+std::vector<T_PUSH_POINT> PointsOf(const T_PUSH_EVALUATION& e, double sign, double start)
 {
     std::vector<T_PUSH_POINT> out;
     const auto add = [&](PUSH_POINT kind, const std::string& state, std::optional<double> d) {
         if (!d || *d == 0.0 || !std::isfinite(*d)) return;
-        out.push_back({kind, state, sign * std::fabs(ToSi(*d, e.units, kDimLength))});
+        out.push_back({kind, state, start + sign * std::fabs(ToSi(*d, e.units, kDimLength))});
     };
     if (e.point) add(PUSH_POINT::Performance, {}, e.point->D);
     for (const T_LIMIT_ROW& row : e.limitStates) {
@@ -92,7 +109,7 @@ std::vector<T_HINGES_AT> HingesOfEvaluations(CDBDoc& doc,
         out[i].push = e.eval.push;
         out[i].units = e.units;
         std::vector<T_PUSH_POINT> points =
-            PointsOf(e, SignOf(doc.Data().Model().pushovers.at(key)));
+            PointsOf(e, SignOf(doc.Data().Model().pushovers.at(key)), StartOf(doc, key));
         if (!points.empty()) wanted[key][&out[i]] = std::move(points);
     }
     CPushRun push(doc);

@@ -115,8 +115,9 @@ T_MODEL_CONTENT RichContent()
     content.results[1] = MakePushResult(px);
     content.results[3] = MakePushResult({{1.0}, {2.0}, {}});
     T_RUN_DATA run;
-    run.head = {2, 30.0, {0.5, -0.0, 0, 0, 0, 0}, {1, 2, 3, 4}, {{}, 0, 1.0, 0.5, 4}};
+    run.head = {2, 30.0, {0.5, -0.0, 0, 0, 0, 0}, 0.25, {1, 2, 3, 4}, {{}, 0, 1.0, 0.5, 4}};
     run.nodes = {2, 7};
+    run.start = {{0.5, -0.0}, {}};
     run.hinges = {{4, 0.5, 5}};
     run.steps = {{0, 0.5, 0.1, 2, {1, 2, 3, 4, 5, 6}, 1e-15, false}, {0, 1, 0.5, 4, {}, 0, true}};
     run.displacement = {{{1}, {2}}, {{-0.0}, {Limits::max()}}};
