@@ -62,7 +62,7 @@ std::string PointLine(const T_PUSH_AT_POINT& at, const T_SEEN& seen, const T_UNI
     if (at.found != AT_POINT::Reached) return text + "  " + WhyNot(at.found) + "\n";
     for (std::size_t s = 0; s < seen.size(); ++s)
         if (seen[s]) text += FormatText(" %8zu", at.states[s]);
-    return text + "  " + Padded(WorstText(at), 30) + "  " + DriftText(at) + "\n";
+    return text + "  " + Padded(WorstText(at), 36) + "  " + DriftText(at) + "\n";
 }
 
 std::string WorstLines(const T_PUSH_AT_POINT& at, const T_UNITS& units)
@@ -130,7 +130,7 @@ std::string HingesAtTable(const T_HINGES_AT& h)
     for (std::size_t s = 0; s < seen.size(); ++s)
         if (seen[s]) text += FormatText(" %8s", kPushStateNames[s]);
     text +=
-        "  " + Padded(Say("IDS_QM_PUSH_AT_WORST"), 30) + "  " + Say("IDS_QM_PUSH_AT_DRIFT") + "\n";
+        "  " + Padded(Say("IDS_QM_PUSH_AT_WORST"), 36) + "  " + Say("IDS_QM_PUSH_AT_DRIFT") + "\n";
     for (const T_PUSH_AT_POINT& at : h.points)
         text += PointLine(at, seen, h.units);
     return text;

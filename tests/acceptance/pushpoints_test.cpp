@@ -1,0 +1,132 @@
+// What the hinges do at the points of an evaluation, against the exact path of an independent
+// calculation (tests/data/push).
+#include "pushcase.h"
+
+namespace {
+
+/// The load factor of the frame at a displacement, straight between the vertices of its path.
+double FactorAt(const json& path, double displacement)
+{
+    for (std::size_t i = 1; i < path.size(); ++i) {
+        const double from = path[i - 1][1], to = path[i][1];
+        if (displacement > to) continue;
+        const double factor = path[i - 1][0];
+        return factor + (path[i][0].get<double>() - factor) * (displacement - from) / (to - from);
+    }
+    return 0.0;
+}
+
+class PushPoints : public CPushTest {
+protected:
+    /// The two-storey frame with masses, one mode, and two evaluations; pushed to this side.
+    static json Frame(double side)
+    {
+        json file = Data("pc_two_storey");
+        for (json& node : file["nodes"])
+            if (node["id"] == 3 || node["id"] == 6) node["mass"] = {20, 0, 0};
+        for (json& load : file["load_cases"][0]["nodal"])
+            for (json& value : load["load"])
+                value = side * value.get<double>();
+        file["pushover"][0]["control"]["master_max_displ"] = side * 0.35;
+        file["modes"] = json::parse(
+            R"([{"period": 0.6, "shape": {"3": [0.5, 0, 0, 0, 0, 0], "6": [1, 0, 0, 0, 0, 0]}}])");
+        file["spectra"] = json::parse(R"([{"name": "S", "kind": "user", "T": [0, 0.5, 2, 10],
+                                           "Sa": [0.8, 2, 0.5, 0.1]}])");
+        file["evaluations"] = json::parse(R"([
+            {"name": "A", "push": "P", "method": "ATC-40", "procedure": "B", "spectrum": "S"},
+            {"name": "E", "push": "P", "method": "EC8/OPCM", "spectrum": "S"}])");
+        return file;
+    }
+
+    json Evaluated(const json& file, int code) const
+    {
+        Write("c.json", file.dump(1));
+        return Json("evaluate c.json", code);
+    }
+};
+
+/// Storeys of 3.5 m, loads of 1 and 1.5 times the load factor; C lies at a rotation of 1.
+void ExpectOnPath(const json& at, const json& expected, double side)
+{
+    const double d = side * at.at("displacement").get<double>();
+    const double factor = FactorAt(expected["path"], d);
+    const double close = 1e-9 * expected["peak"].get<double>();
+    EXPECT_NEAR(factor, at.at("load_factor"), close) << d;
+    const auto flowed = std::ranges::count_if(
+        expected["events"], [&](const json& e) { return e[2].get<double>() <= d; });
+    EXPECT_EQ(14 - flowed, at.at("states").at("elastic")) << d;
+    EXPECT_EQ(flowed, at["states"].at("B-C")) << d;
+    EXPECT_EQ(flowed, at.at("worst").size()) << d;
+    double before = 1.0, below = 0.0;
+    for (const json& hinge : at["worst"]) {
+        EXPECT_NEAR(std::fabs(hinge.at("deformation").get<double>()), hinge.at("ratio"), 1e-12);
+        EXPECT_EQ("C", hinge.at("ratio_of"));
+        EXPECT_GE(before, hinge["ratio"].get<double>());
+        before = hinge["ratio"];
+    }
+    for (const auto& [k, load] : {std::pair{0U, 2.5}, {1U, 1.5}}) {
+        const json& storey = at.at("storeys").at(k);
+        EXPECT_NEAR(side * load * factor, storey.at("shear"), 2.5 * close) << d;
+        const double displacement = storey.at("displacement");
+        EXPECT_NEAR((displacement - below) / 3.5, storey.at("drift"), 1e-12) << d;
+        below = displacement;
+    }
+    EXPECT_NEAR(side * d, below, 1e-9) << d;
+}
+
+TEST_F(PushPoints, LieOnTheIndependentPath)
+{
+    const json expected =
+        json::parse(ReadText(ProjectFolder() / "tests/data/push/pc_two_storey.expected.json"));
+    for (const double side : {1.0, -1.0}) {
+        const json all = Evaluated(Frame(side), 0);
+        const json& point = all[0].at("hinges_at");
+        ASSERT_EQ(1U, point.size());
+        EXPECT_EQ("performance point", point[0].at("point"));
+        EXPECT_NEAR(all[0]["performance_point"]["D"].get<double>(),
+                    side * point[0]["displacement"].get<double>(), 1e-12);
+        EXPECT_NEAR(all[0]["performance_point"]["V"].get<double>(),
+                    side * point[0]["storeys"][0]["shear"].get<double>(), 1e-6);
+        EXPECT_FALSE(all[0].contains("hinges_not_at"));
+        const json& states = all[1].at("hinges_at");
+        ASSERT_EQ(2U, states.size());
+        for (const json& at : {point[0], states[0], states[1]})
+            ExpectOnPath(at, expected, side);
+        EXPECT_EQ("SD", states[1].at("point"));
+        EXPECT_EQ("demand", states[1].at("of"));
+        const json& beyond = all[1].at("hinges_not_at"); // the push ends at 0.35
+        ASSERT_EQ(1U, beyond.size());
+        EXPECT_EQ("NC", beyond[0].at("point"));
+        EXPECT_LT(0.35, side * beyond[0].at("displacement").get<double>());
+        EXPECT_EQ("beyond the push", beyond[0].at("reason"));
+    }
+}
+
+TEST_F(PushPoints, StandInTableAndReport)
+{
+    Write("c.json", Frame(1.0).dump(1));
+    const std::string table = Done("evaluate c.json --report r.txt"), report = Text("r.txt");
+    for (const std::string& text : {table, report})
+        ExpectHolds(text, {"Hinges at the points of A, push P (kN, m)", "performance point",
+                           "NC: demand", "beyond the push", "8 J Mz, B-C"});
+    EXPECT_EQ(std::string::npos, table.find("Storeys: displacement"));
+    ExpectHolds(report, {"Storeys: displacement, drift, shear", "S2"});
+}
+
+TEST_F(PushPoints, AreNotGuessedWhereTheyCannotBeComputed)
+{
+    json byLoad = Frame(1.0);
+    byLoad["pushover"][0]["control"] = {{"increment_method", "force"}};
+    byLoad["pushover"][0]["patterns"][0]["factor"] = 85.0;
+    byLoad["evaluations"].erase(0);
+    const json all = Evaluated(byLoad, 0);
+    EXPECT_TRUE(all[0].at("hinges_at").empty());
+    ExpectHolds(all[0].at("hinges_not_at").at(0).at("reason").get<std::string>(),
+                {"not controlled by the displacement"});
+
+    Write("imported.json", kSmallCase);
+    EXPECT_FALSE(Json("evaluate imported.json")[0].contains("hinges_at"));
+    EXPECT_EQ(std::string::npos, Done("evaluate imported.json").find("Hinges at"));
+}
+
+} // namespace
