@@ -105,7 +105,7 @@ std::vector<T_HINGES_AT> HingesOfEvaluations(CDBDoc& doc,
         if (!doc.Attr().FindPolc(e.eval.push, key) || !doc.Post().RunOf(key) ||
             doc.Post().IsStale(key, old))
             continue;
-        out[i].evaluation = e.eval.name;
+        out[i].evaluation = e.eval.name.empty() ? MethodName(e.eval.method) : e.eval.name;
         out[i].push = e.eval.push;
         out[i].units = e.units;
         std::vector<T_PUSH_POINT> points =

@@ -4,6 +4,8 @@
 #include "qm_db/editscope.h"
 #include "qm_db/recordfacts.h"
 #include "qm_rps/desk/recordnames.h"
+#include "qm_rps/evaluatedsteps.h"
+#include "qm_rps/push/pushatpointtext.h"
 #include "qm_rps/pushover/report/pushoverreport.h"
 #include "qm_rps/pushovercomparisondlg.h"
 #include "qm_rps/pushovercontroldlg.h"
@@ -271,7 +273,10 @@ void CPushOverCurveEdit::ShowText(const char* titleKey, std::string text)
 
 void CPushOverCurveEdit::OnPushoverCurveTextout()
 {
-    ShowText("IDS_QM_UI_PUSH_REPORT_TITLE", PushoverReportText(m_shown.Result()));
+    const T_PUSH_EVALUATION& result = m_shown.Result();
+    const auto hinges = HingesOfEvaluations(m_doc, {&result, 1}, {});
+    ShowText("IDS_QM_UI_PUSH_REPORT_TITLE",
+             PushoverReportText(result) + HingesAtReport(hinges.front()));
 }
 
 void CPushOverCurveEdit::OnCurveText()
