@@ -9,8 +9,6 @@
 
 namespace {
 
-constexpr int kByDisplacement = 1; // T_POLC_CONTROL::incrementMethod
-
 /// Curves are drawn to the right whichever way the structure is pushed.
 double SignOf(const T_POLC_D& record)
 {
@@ -60,11 +58,10 @@ std::string WhyNotPushed(const T_POLC_D& record)
     return many ? Say("IDS_QM_PUSH_AT_DIRECTIONS") : std::string();
 }
 
-/// Displacements that the engine can be asked for; of a push by load it takes none.
+/// Displacements that the engine can be asked for.
 std::vector<double> StepsAt(const T_POLC_D& record, const std::vector<T_PUSH_POINT>& points)
 {
     std::vector<double> out;
-    if (!record.control || record.control->incrementMethod != kByDisplacement) return out;
     for (const T_PUSH_POINT& point : points)
         if (IsOnTheWay(record, point.displacement)) out.push_back(point.displacement);
     return out;

@@ -113,17 +113,26 @@ TEST_F(PushPoints, StandInTableAndReport)
     ExpectHolds(report, {"Storeys: displacement, drift, shear", "S2"});
 }
 
-TEST_F(PushPoints, AreNotGuessedWhereTheyCannotBeComputed)
+TEST_F(PushPoints, AreStepsOfAPushByLoadToo)
 {
+    const json expected =
+        json::parse(ReadText(ProjectFolder() / "tests/data/push/pc_two_storey.expected.json"));
     json byLoad = Frame(1.0);
     byLoad["pushover"][0]["control"] = {{"increment_method", "force"}};
     byLoad["pushover"][0]["patterns"][0]["factor"] = 85.0;
     byLoad["evaluations"].erase(0);
     const json all = Evaluated(byLoad, 0);
-    EXPECT_TRUE(all[0].at("hinges_at").empty());
-    ExpectHolds(all[0].at("hinges_not_at").at(0).at("reason").get<std::string>(),
-                {"not controlled by the displacement"});
+    const json& reached = all[0].at("hinges_at");
+    ASSERT_EQ(1U, reached.size());
+    EXPECT_EQ("DL", reached[0].at("point"));
+    const double d = reached[0].at("displacement"), close = 1e-9 * expected["peak"].get<double>();
+    const double share = reached[0].at("load_factor"); // of 85 times the loads
+    EXPECT_NEAR(FactorAt(expected["path"], d), 85.0 * share, close);
+    EXPECT_EQ(2U, all[0].at("hinges_not_at").size());
+}
 
+TEST_F(PushPoints, AreNotOfCurvesOfAnotherProgram)
+{
     Write("imported.json", kSmallCase);
     EXPECT_FALSE(Json("evaluate imported.json")[0].contains("hinges_at"));
     EXPECT_EQ(std::string::npos, Done("evaluate imported.json").find("Hinges at"));
