@@ -5,6 +5,7 @@
 #include "push/pushfirst.h"
 #include "qm_base/say.h"
 #include "qm_rps/push/pushatpointtext.h"
+#include "qm_rps/pushended.h"
 #include "qm_rps/pushover/evaluation/pushovercomparison.h"
 #include "qm_rps/pushover/report/pushoverreport.h"
 #include "qm_rps/pushovercalculators.h"
@@ -98,7 +99,7 @@ EXIT_CODE EvaluateAll(CDBDoc& doc, const T_EVALUATE_OPTIONS& options,
         if (const std::string fault = ReadFault(doc, eval.push); !fault.empty())
             return Complain(EXIT_CODE::BadInput, fault);
         extras = AddExtras(driver, options, points) && extras;
-        out.push_back(driver.Result());
+        AddPushRemark(doc, out.emplace_back(driver.Result()));
     }
     progress(total, total);
     if (!out.empty()) return EXIT_CODE::Done;
@@ -229,6 +230,8 @@ EXIT_CODE RunCompare(const T_COMPARE_OPTIONS& o)
         return Complain(EXIT_CODE::Usage, o.file + ": " + refusal.text);
     if (const std::string fault = ReadFault(doc, o.push); !fault.empty())
         return Complain(EXIT_CODE::BadInput, fault);
+    for (T_PUSH_EVALUATION& result : comparison.results)
+        AddPushRemark(doc, result);
     EXIT_CODE code = EXIT_CODE::Done;
     if (!o.json.empty()) code = WriteOutput(o.json, ResultJson(comparison.results));
 #ifdef QM_UI
@@ -236,7 +239,11 @@ EXIT_CODE RunCompare(const T_COMPARE_OPTIONS& o)
         code = WritePicture(ComparisonPlot(comparison), o.plot);
 #endif
     if (code != EXIT_CODE::Done) return code;
-    if (o.json != "-") std::printf("%s", ComparisonTable(comparison).c_str());
+    if (o.json != "-") {
+        std::printf("%s", ComparisonTable(comparison).c_str());
+        if (const auto remark = PushRemark(doc, o.push))
+            std::printf("! %s\n", remark->text.c_str());
+    }
     const bool all = std::ranges::all_of(comparison.rows, &T_COMPARISON_ROW::found);
     return all ? EXIT_CODE::Done : EXIT_CODE::NotFound;
 }

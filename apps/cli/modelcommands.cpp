@@ -3,9 +3,11 @@
 #include "inputfile.h"
 #include "output.h"
 #include "qm_base/say.h"
+#include "qm_base/textformat.h"
 #include "qm_db/casefile.h"
 #include "qm_db/modelstore.h"
-#include "qm_rps/pushover/pushevaluation.h"
+#include "qm_rps/push/pushresultlist.h"
+#include "qm_rps/pushended.h"
 
 #include <cstdio>
 
@@ -22,6 +24,21 @@ std::string Line(std::size_t blanks, std::string_view key, const ARGS&... args)
 std::string StepText(int step)
 {
     return step >= 0 ? std::to_string(step) : "-";
+}
+
+/// How the pushes of a load case have ended, and whether the model has been changed since.
+std::string PushLines(CDBDoc& doc, int pushover)
+{
+    std::string text, why;
+    for (const T_PUSH_RESULT_ID& id : PushResultsOf(doc)) {
+        const auto ended = id.key == pushover ? PushEndedOf(doc, id.key, id.turn) : std::nullopt;
+        if (!ended) continue;
+        text += Line(4, "IDS_QM_CLI_INFO_PUSH_END", id.name,
+                     FormatText("%.6g", ended->displacement) + " " + ended->unit,
+                     PushStatusText(ended->status), PushOutcomeText(ended->outcome));
+        if (doc.Post().IsStale(id.key, why, id.turn)) text += "    ! " + why + "\n";
+    }
+    return text;
 }
 
 /// What a document holds: title, units, counts, load cases, evaluations, stored steps.
@@ -42,6 +59,7 @@ std::string InfoText(CDBDoc& doc)
                      std::to_string(polc.controlNode),
                      kDirectionNames[static_cast<std::size_t>(polc.direction - 1)],
                      kPatternNames[static_cast<std::size_t>(polc.patternKind)]);
+        text += PushLines(doc, key);
         std::array<int, 3> s{};
         if (doc.Post().GetPoverInfo()->GetStepEC8(key, s))
             text += Line(4, "IDS_QM_CLI_INFO_EC8", StepText(s[0]), StepText(s[1]), StepText(s[2]));

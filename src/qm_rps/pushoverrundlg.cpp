@@ -178,10 +178,8 @@ int CPushOverRunDlg::TakeResults(CPushWorker& worker)
 
 void CPushOverRunDlg::AddRow(const T_PUSH_RUN& run)
 {
-    constexpr const char* kStatus[] = {"IDS_QM_CLI_PUSH_REACHED", "IDS_QM_CLI_PUSH_STOPPED",
-                                       "IDS_QM_CLI_PUSH_FAILED"}; // by PUSH_STATUS
-    const std::string outcome = Say(run.cancelled ? "IDS_QM_UI_PUSH_RUN_CANCELLED"
-                                                  : kStatus[static_cast<std::size_t>(run.status)]);
+    const std::string outcome =
+        run.cancelled ? Say("IDS_QM_UI_PUSH_RUN_CANCELLED") : PushStatusText(run.status);
     T_ROW row{run.key,
               run.name,
               outcome,

@@ -61,7 +61,9 @@ int AddPushovers(CDBDoc& doc, SSReportInfoRW& out, std::string& error)
 {
     CPostCtrl& post = doc.Post();
     for (const auto& [key, record] : doc.Data().Model().pushovers) {
-        T_REPORT_PUSH push{key, record.name, record.controlNode, record.direction, {}, {}};
+        T_REPORT_PUSH push{key, record.name, record.controlNode,    record.direction,
+                           {},  {},          PushEndedOf(doc, key), {}};
+        (void)post.IsStale(key, push.old);
         const int steps = post.SelectPushover(key) ? post.GetStepCount() : 0;
         for (int step = 1; step <= steps; ++step) {
             if (ReadStep(doc, push, step)) continue;
@@ -88,7 +90,7 @@ int AddEvaluations(CDBDoc& doc, SSReportInfoRW& out, std::string& error)
             return 0;
         }
         driver.Evaluate();
-        out.evaluations.push_back(driver.Result());
+        AddPushRemark(doc, out.evaluations.emplace_back(driver.Result()));
     }
     return 1;
 }

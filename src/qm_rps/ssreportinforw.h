@@ -3,7 +3,7 @@
 #pragma once
 
 #include "qm_db/dbdoc.h"
-#include "qm_rps/pushover/pushevaluation.h"
+#include "qm_rps/pushended.h"
 
 /// A storey, bottom to top.
 struct T_REPORT_STOREY {
@@ -36,6 +36,8 @@ struct T_REPORT_PUSH {
     int direction = 1; // 1 to 6: DX to RZ
     std::vector<T_REPORT_STEP> steps;
     std::vector<T_REPORT_LIMIT> limitStates; // those that the model keeps
+    std::optional<T_PUSH_ENDED> ended;       // empty: steps of another solver, or none
+    std::string old; // why the steps are older than the model; empty where they are not
 };
 
 struct SSReportInfoRW {

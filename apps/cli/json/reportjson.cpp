@@ -38,6 +38,21 @@ void Write(CJsonText& w, const T_REPORT_PUSH& p, const std::vector<T_REPORT_STOR
     w.Object();
     w.Member("name", p.name).Member("control_node", p.controlNode);
     w.Member("direction", kDirectionNames.at(static_cast<std::size_t>(p.direction - 1)));
+    w.Key("ended");
+    if (p.ended) {
+        w.Object();
+        w.Member("status", kPushStatusNames[static_cast<std::size_t>(p.ended->status)]);
+        w.Member("outcome", PushOutcomeName(p.ended->outcome));
+        w.Member("displacement", p.ended->displacement);
+        w.End();
+    } else {
+        w.Value(nullptr);
+    }
+    w.Key("old");
+    if (p.old.empty())
+        w.Value(nullptr);
+    else
+        w.Value(p.old);
     w.Key("limit_states").List();
     for (const T_REPORT_LIMIT& l : p.limitStates) {
         w.Object();

@@ -30,10 +30,9 @@ EXIT_CODE FindCases(CDBDoc& doc, const T_PUSH_OPTIONS& o, std::vector<int>& out)
             return Complain(EXIT_CODE::Usage, o.file + ": " + Say("IDS_QM_CLI_NO_PUSH", name));
         if (std::ranges::find(out, key) == out.end()) out.push_back(key);
     }
-    if (!o.cases.empty() && !o.all) return EXIT_CODE::Done;
+    if (!o.cases.empty()) return EXIT_CODE::Done;
     for (const auto& [key, record] : model.pushovers)
-        if ((o.all || record.control) && std::ranges::find(out, key) == out.end())
-            out.push_back(key);
+        if (o.all || record.control) out.push_back(key);
     if (!out.empty()) return EXIT_CODE::Done;
     return Complain(EXIT_CODE::BadInput, o.file + ": " + Say("IDS_QM_CLI_PUSH_NO_CASE"));
 }
@@ -43,7 +42,7 @@ EXIT_CODE ReadNodes(CDBDoc& doc, const T_PUSH_OPTIONS& o, std::set<int>& out)
     if (o.nodes.empty()) return EXIT_CODE::Done;
     const auto ids = ParseElementList(o.nodes);
     if (!ids || ids->empty())
-        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_ELEMENT_LIST", o.nodes));
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_PUSH_NODE_LIST", o.nodes));
     for (const int id : *ids) {
         if (!doc.Data().Model().nodes.contains(id))
             return Complain(EXIT_CODE::Usage,
@@ -69,6 +68,21 @@ EXIT_CODE PrintTables(const T_PUSH_OPTIONS& o, const std::vector<T_PUSH_RUN>& ru
     return EXIT_CODE::Done;
 }
 
+/// Steps of another solver can't be had again from the model: the push does not put its own in
+/// their place in the file that it reads, unless it is told to.
+EXIT_CODE KeepImported(CDBDoc& doc, const T_PUSH_OPTIONS& o, const std::vector<int>& keys)
+{
+    if (o.overwrite || o.noStore || !o.out.empty() || !IsModelFile(o.file)) return EXIT_CODE::Done;
+    const T_RESULT_MAP& results = doc.Data().Content().results;
+    for (const int key : keys) {
+        const auto it = results.find(key);
+        if (it == results.end() || !it->second || it->second->Run()) continue;
+        const std::string& name = doc.Data().Model().pushovers.at(key).name;
+        return Complain(EXIT_CODE::NoAccess, o.file + ": " + Say("IDS_QM_CLI_PUSH_IMPORTED", name));
+    }
+    return EXIT_CODE::Done;
+}
+
 /// A model file keeps the results; -o writes another file.
 EXIT_CODE Store(CDBDoc& doc, const T_PUSH_OPTIONS& o)
 {
@@ -82,6 +96,10 @@ EXIT_CODE Store(CDBDoc& doc, const T_PUSH_OPTIONS& o)
 
 EXIT_CODE RunPush(const T_PUSH_OPTIONS& o)
 {
+    if (o.all && !o.cases.empty())
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_SETUP_BOTH", "--all", "--case"));
+    if (!o.nodes.empty() && o.json.empty())
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_PUSH_NODES_JSON"));
     if (const EXIT_CODE code = CheckPlotName(o.plot); code != EXIT_CODE::Done) return code;
     if (const EXIT_CODE code = CheckOutputs(o.file,
                                             {{o.json, OUTPUT_KIND::Json},
@@ -96,6 +114,7 @@ EXIT_CODE RunPush(const T_PUSH_OPTIONS& o)
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     if (const EXIT_CODE code = FindCases(doc, o, keys); code != EXIT_CODE::Done) return code;
     if (const EXIT_CODE code = ReadNodes(doc, o, nodes); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = KeepImported(doc, o, keys); code != EXIT_CODE::Done) return code;
     std::vector<T_PUSH_RUN> runs;
     const T_UNITS units = doc.Unit().Units();
     if (const EXIT_CODE code = PushCases(doc, o.file, keys, runs); code != EXIT_CODE::Done)

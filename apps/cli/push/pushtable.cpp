@@ -2,6 +2,7 @@
 
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/desk/hingemarks.h"
 
 #include <algorithm>
 
@@ -46,11 +47,8 @@ std::string MomentUnit(const T_UNITS& units)
 
 std::string PushTable(const T_PUSH_RUN& run, const T_UNITS& units, std::size_t mostRows)
 {
-    constexpr const char* kStatus[] = {"IDS_QM_CLI_PUSH_REACHED", "IDS_QM_CLI_PUSH_STOPPED",
-                                       "IDS_QM_CLI_PUSH_FAILED"};
-    std::string text = "\n== " + run.name + ": " +
-                       Say(kStatus[static_cast<std::size_t>(run.status)]) + " (" + run.outcome +
-                       ")\n" + run.advice + "\n";
+    std::string text = "\n== " + run.name + ": " + PushStatusText(run.status) + " (" +
+                       PushOutcomeText(run.data.head.end.outcome) + ")\n" + run.advice + "\n";
     const std::vector<std::size_t> rows = Rows(run, mostRows);
     if (rows.empty()) return text + Say("IDS_QM_CLI_PUSH_NO_STEP") + "\n";
     const bool turns = run.direction > 2;
@@ -65,7 +63,8 @@ std::string PushTable(const T_PUSH_RUN& run, const T_UNITS& units, std::size_t m
                        Head("IDS_QM_CLI_PUSH_DISPLACEMENT", length).c_str(),
                        Head("IDS_QM_CLI_PUSH_REACTION", force).c_str());
     for (std::size_t s = 0; s < seen.size(); ++s)
-        if (seen[s] > 0) text += FormatText(" %8s", kPushStateNames[s]);
+        if (seen[s] > 0)
+            text += FormatText(" %8s", PushStateText(static_cast<PUSH_STATE>(s)).c_str());
     for (const std::size_t row : rows) {
         const bool asked =
             std::ranges::find(run.additional, static_cast<int>(row + 1)) != run.additional.end();
@@ -102,7 +101,7 @@ std::string PushHingeTable(const T_PUSH_RUN& run, const T_UNITS& units)
                            kComponentNames[static_cast<std::size_t>(hinge.place.component)],
                            FromSi(hinge.deformation.back(), units, moment ? kDimNone : kDimLength),
                            FromSi(hinge.force.back(), units, StrengthDim(hinge.place.component)),
-                           kPushStateNames[static_cast<std::size_t>(hinge.state.back())]);
+                           PushStateText(hinge.state.back()).c_str());
     }
     return text +
            Say("IDS_QM_CLI_PUSH_HINGE_UNITS", std::string(NameOf(units.length)),

@@ -52,6 +52,18 @@ std::string PushOutcomeName(solver::PUSH_OUTCOME outcome)
     return zql::lib::MMSGFunction::GetValueOf("en", RowOf(outcome).name);
 }
 
+std::string PushStatusText(PUSH_STATUS status)
+{
+    constexpr const char* kKeys[] = {"IDS_QM_CLI_PUSH_REACHED", "IDS_QM_CLI_PUSH_STOPPED",
+                                     "IDS_QM_CLI_PUSH_FAILED"};
+    return Say(kKeys[static_cast<std::size_t>(status)]);
+}
+
+std::string PushOutcomeText(solver::PUSH_OUTCOME outcome)
+{
+    return Say(RowOf(outcome).name);
+}
+
 std::string PushOutcomeAdvice(solver::PUSH_OUTCOME outcome, double loadFactor,
                               const std::string& hinge)
 {

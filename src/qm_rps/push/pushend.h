@@ -12,6 +12,9 @@ inline constexpr const char* kPushStatusNames[] = {"reached", "stopped", "failed
 PUSH_STATUS StatusOf(solver::PUSH_OUTCOME outcome);
 /// Short name, always in English ("target reached").
 std::string PushOutcomeName(solver::PUSH_OUTCOME outcome);
+/// Both in the chosen language.
+std::string PushStatusText(PUSH_STATUS status);
+std::string PushOutcomeText(solver::PUSH_OUTCOME outcome);
 /// What it means and what to look at, in the chosen language. loadFactor: of the end; hinge: the
 /// one that ended it, in words, may be empty.
 std::string PushOutcomeAdvice(solver::PUSH_OUTCOME outcome, double loadFactor,

@@ -1,0 +1,48 @@
+#include "qm_rps/pushended.h"
+
+#include "qm_base/say.h"
+#include "qm_base/textformat.h"
+#include "qm_rps/push/pushcases.h"
+#include "qm_rps/push/pushquantity.h"
+
+std::optional<T_PUSH_ENDED> PushEndedOf(CDBDoc& doc, int key, int turn)
+{
+    IPushRun* const run = doc.Post().RunOf(key, turn);
+    const auto record = doc.Data().Model().pushovers.find(key);
+    if (!run || record == doc.Data().Model().pushovers.end()) return std::nullopt;
+    const T_RUN_END& end = run->Head().end;
+    T_PUSH_ENDED out{StatusOf(end.outcome), end.outcome, false, 0.0, {}};
+    std::vector<int> chain;
+    std::string unknown;
+    out.earlier = end.outcome != solver::PUSH_OUTCOME::InitialLoads &&
+                  PushChainOf(doc.Data().Model(), key, chain, unknown) &&
+                  end.stage + 1 < std::ssize(chain);
+    if (out.earlier) out.status = PUSH_STATUS::Failed;
+    const T_PUSH_QUANTITY length =
+        DisplacementIn(static_cast<std::size_t>(record->second.direction - 1), doc.Unit().Units());
+    std::vector<T_RUN_STEP> steps;
+    const bool any = run->ReadSteps(steps) && !steps.empty();
+    out.displacement = length.Shown(any ? steps.back().displacement : end.displacement);
+    out.unit = length.Unit();
+    return out;
+}
+
+std::optional<zql::frx::T_MESSAGE> PushRemark(CDBDoc& doc, const std::string& push)
+{
+    int key = 0;
+    if (!doc.Attr().FindPolc(push, key)) return std::nullopt;
+    const std::optional<T_PUSH_ENDED> ended = PushEndedOf(doc, key);
+    if (!ended || ended->status != PUSH_STATUS::Failed) return std::nullopt;
+    const char* const text = ended->outcome == solver::PUSH_OUTCOME::Cancelled
+                                 ? "IDS_QM_PUSH_CUT_CANCELLED"
+                             : ended->earlier ? "IDS_QM_PUSH_CUT_EARLIER"
+                                              : "IDS_QM_PUSH_CUT";
+    const std::string where = FormatText("%.6g", ended->displacement) + " " + ended->unit;
+    return zql::frx::T_MESSAGE{text, Say(text, push, where, PushOutcomeText(ended->outcome))};
+}
+
+void AddPushRemark(CDBDoc& doc, T_PUSH_EVALUATION& result)
+{
+    if (auto remark = PushRemark(doc, result.eval.push))
+        result.messages.push_back(std::move(*remark));
+}
