@@ -115,9 +115,6 @@ struct T_PUSH_MODEL {
     int vertical = 2; // axis of gravity: 0 X, 1 Y, 2 Z
     std::vector<T_PUSH_DRIFT> drifts;
     std::size_t mostEvents = 100000;
-    /// Go on along the path where the control displacement falls back although no later
-    /// equilibrium at a larger displacement is known to exist.
-    bool followSnapBack = true;
 };
 
 } // namespace solver
