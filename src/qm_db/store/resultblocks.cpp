@@ -23,7 +23,7 @@ struct T_PART {
     const char* nameKey;
     int width;
 };
-constexpr std::array<T_PART, 16> kParts{{{"IDS_QM_DB_PART_LOAD_FACTORS", 8},
+constexpr std::array<T_PART, 17> kParts{{{"IDS_QM_DB_PART_LOAD_FACTORS", 8},
                                          {"IDS_QM_DB_PART_BASE_REACTIONS", 8},
                                          {"IDS_QM_DB_PART_NODE_IDS", 4},
                                          {"IDS_QM_DB_PART_DISPLACEMENTS", 8},
@@ -38,7 +38,9 @@ constexpr std::array<T_PART, 16> kParts{{{"IDS_QM_DB_PART_LOAD_FACTORS", 8},
                                          {"IDS_QM_DB_PART_EVENTS", 8},
                                          {"IDS_QM_DB_PART_EVENTS", 4},
                                          {"IDS_QM_DB_PART_DISPLACEMENTS", 8},
-                                         {"IDS_QM_DB_PART_HINGE_STATES", 8}}};
+                                         {"IDS_QM_DB_PART_HINGE_STATES", 8},
+                                         {"IDS_QM_DB_PART_DISPLACEMENTS", 8}}};
+static_assert(kParts.size() == static_cast<std::size_t>(BLOCK_PART::RunStart) + 1);
 
 const T_PART& PartOf(const T_BLOCK_KEY& key)
 {

@@ -79,8 +79,8 @@ TEST(PushPatterns, RowsAddUpTimesTheirFactors)
         double x2, x3, z2; // node 2 and 3
     } cases[] = {
         {"static", {{0, 1, 3}}, 0, 21, 0},
-        {"acceleration", {{1, 1, 2}}, 64, 32, 0}, // 2 + 30 and 1 + 15 kg
-        {"mode", {{2, 1, 10}}, 4, 10, 1},
+        {"acceleration", {{1, 1, 2}}, 64, 32, 0},  // 2 + 30 and 1 + 15 kg
+        {"mode", {{2, 1, 10}}, 128, 160, 30},      // 10 times mass times shape
         {"mode x mass", {{3, 1, 1}}, 12.8, 16, 3}, // 30 kg move along Z
         {"two", {{0, 1, 1}, {1, 1, 0.5}}, 16, 15, 0},
     };
