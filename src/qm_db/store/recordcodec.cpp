@@ -47,7 +47,8 @@ void WritePushControl(const T_MODEL& model, CPackedArrays& arrays)
 {
     if (model.pushControl == T_POGC_D()) return;
     CRecordRow row(kPushControl, 1);
-    CRowPut put(row, arrays, CTablePlaces(std::string_view(kPushControl)));
+    const CTablePlaces places{std::string_view(kPushControl)};
+    CRowPut put(row, arrays, places);
     RowFields(put, model.pushControl);
 }
 
@@ -77,10 +78,11 @@ void ReadTexts(const T_RECORD_ROW<R>& kind, const CPackedArrays& arrays, T_MODEL
 
 void ReadPushControl(const CPackedArrays& arrays, T_MODEL& model)
 {
+    const CTablePlaces places{std::string_view(kPushControl)};
     for (const std::int64_t key : arrays.Keys(TextOwner(kPushControl))) {
         const CRecordRow row(kPushControl, key);
         if (key != 1) row.ThrowBadCell("key");
-        CRowGet get(row, arrays, CTablePlaces(std::string_view(kPushControl)));
+        CRowGet get(row, arrays, places);
         RowFields(get, model.pushControl);
     }
 }

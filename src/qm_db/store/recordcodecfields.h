@@ -21,6 +21,7 @@ public:
     {
         m_text.BeginObject(true);
     }
+    CRowPut(CRecordRow&, CPackedArrays&, CTablePlaces&&) = delete; // the places are kept by name
     /// The text of the members that have no place of their own; the row has it where it can.
     void Finish();
 
@@ -118,6 +119,7 @@ public:
     static constexpr bool kWrites = false;
 
     CRowGet(const CRecordRow& row, const CPackedArrays& arrays, const CTablePlaces& where);
+    CRowGet(const CRecordRow&, const CPackedArrays&, CTablePlaces&&) = delete;
     void Finish();
 
     CCaseGet& Body() { return m_body; }
