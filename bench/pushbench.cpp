@@ -126,11 +126,11 @@ bool Run(CPushSolver& solver, const T_PUSH_STAGE& stage, std::vector<double>& fa
          std::string& says)
 {
     factors.clear();
-    const T_PUSH_SINK sink{[&](const T_PUSH_STEP& step) {
-                               factors.push_back(step.loadFactor);
-                               return true;
-                           },
-                           {}};
+    T_PUSH_SINK sink;
+    sink.step = [&](const T_PUSH_STEP& step) {
+        factors.push_back(step.loadFactor);
+        return true;
+    };
     T_PUSH_END end;
     T_SOLVER_ERROR error;
     const T_PUSH_STAGE stages[] = {stage};
