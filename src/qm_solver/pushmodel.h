@@ -4,7 +4,9 @@
 
 #include "qm_solver/framemodel.h"
 
+#include <algorithm>
 #include <limits>
+#include <optional>
 
 namespace solver {
 
@@ -90,8 +92,11 @@ struct T_PUSH_STAGE {
     PUSH_CONTROL control = PUSH_CONTROL::Displacement;
     std::size_t node = 0; // control node
     int direction = 0;    // 0 to 5; also of the base reaction
+    /// Translation and reaction along this unit vector instead of `direction`.
+    std::optional<T_VEC3> along;
     /// Of displacement control: displacement of the node, that of earlier stages included, its sign
-    /// is the direction of the push; of load control: the load factor.
+    /// is the direction of the push; of the largest translation its magnitude, the push goes where
+    /// the loads move that node; of load control: the load factor.
     double target = 0.0;
     /// Places of the stored steps: fractions of the way from the start to the target, rising, the
     /// last is 1. Empty: the end alone.
@@ -99,6 +104,17 @@ struct T_PUSH_STAGE {
     std::vector<double> additional; // displacements of the control node that are steps too
     T_PUSH_STOPS stops;
 };
+
+/// Factors of the six directions that displacement and reaction of a stage are taken along.
+inline T_VEC6 WayOf(const T_PUSH_STAGE& stage)
+{
+    T_VEC6 way{};
+    if (stage.along)
+        std::copy(stage.along->begin(), stage.along->end(), way.begin());
+    else
+        way[static_cast<std::size_t>(stage.direction)] = 1.0;
+    return way;
+}
 
 /// The nodes of a storey whose drift is watched, each with the node below (or the ground).
 struct T_PUSH_DRIFT {

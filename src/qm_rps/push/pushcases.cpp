@@ -140,19 +140,15 @@ int Turn(const CAnalysisModel& frame, double step, int times, T_PUSH_CASE& c, st
     c.direction = std::fabs(c.along[0]) >= std::fabs(c.along[1]) ? 0 : 1;
     solver::T_PUSH_STAGE& stage = c.stages.back();
     stage.direction = static_cast<int>(c.direction);
+    stage.along = c.along;
     stage.loads = TurnedAboutZ(stage.loads, frame.Frame(), angle);
     c.angle = angle;
     c.name += "@" + FormatText("%g", angle);
-    if (frame.Frame().nodes[c.controlNode].fixed[c.direction])
-        return Fail(error,
-                    Say("IDS_QM_PUSH_CASE_FIXED", std::to_string(frame.NodeIds()[c.controlNode]),
-                        kDirectionNames[c.direction]));
-    if (stage.control != solver::PUSH_CONTROL::Displacement) return 1;
-    const double share = c.along[c.direction];
-    if (std::fabs(share) != 1.0) return Fail(error, Say("IDS_QM_PUSH_CASE_ANGLE_DISPL"));
-    stage.target *= share;
-    for (double& d : stage.additional)
-        d *= share;
+    for (const std::size_t d : {0U, 1U})
+        if (c.along[d] != 0.0 && frame.Frame().nodes[c.controlNode].fixed[d])
+            return Fail(error, Say("IDS_QM_PUSH_CASE_FIXED",
+                                   std::to_string(frame.NodeIds()[c.controlNode]),
+                                   kDirectionNames[d]));
     return 1;
 }
 
@@ -228,7 +224,7 @@ int BuildPushCases(const T_MODEL& model, const CAnalysisModel& frame, const std:
     } else {
         const double angle = record.control->staticAngle;
         constexpr double kLeast = 1.0; // degrees: 359 directions
-        if (!(angle >= kLeast)) return Fail(error, Say("IDS_QM_PUSH_CASE_ANGLE_SMALL"));
+        if (!(angle >= kLeast && angle < 360.0)) return Fail(error, Say("IDS_QM_PUSH_CASE_ANGLE_SMALL"));
         for (int i = 1; i * angle < 360.0; ++i)
             if (!Turn(frame, angle, i, cases.emplace_back(c), error)) return 0;
     }

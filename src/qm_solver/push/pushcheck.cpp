@@ -117,8 +117,11 @@ std::optional<T_SOLVER_ERROR> CheckStage(const T_PUSH_MODEL& model, const CFrame
     };
     if (stage.node >= model.frame.nodes.size() || stage.direction < 0 || stage.direction > 5)
         return fail("IDS_QM_ENGINE_PUSH_NO_NODE");
-    const std::size_t full = 6 * stage.node + static_cast<std::size_t>(stage.direction);
-    if (stage.control == PUSH_CONTROL::Displacement && dofs.Terms(full).empty()) {
+    const T_VEC6 way = WayOf(stage);
+    bool moves = false;
+    for (std::size_t d = 0; d < way.size(); ++d)
+        moves |= way[d] != 0.0 && !dofs.Terms(6 * stage.node + d).empty();
+    if (stage.control == PUSH_CONTROL::Displacement && !moves) {
         error.node = static_cast<long>(stage.node);
         error.direction = stage.direction;
         return fail("IDS_QM_ENGINE_PUSH_CONTROL_FIXED");

@@ -81,7 +81,7 @@ CPushPath::T_FAULT CPushPath::BeginStage(std::size_t set, std::optional<std::siz
     m_factors.resize(set + 1, 0.0);
     m_control = control;
     m_border = control ? 0 : 1;
-    m_before.clear();
+    m_hasBefore = false;
     m_rate.force.clear();
     return Renew();
 }

@@ -200,6 +200,7 @@ private:
     T_PUSH_RATE m_rate;
     double m_norm = 0.0;          // of the rates
     std::size_t m_sinceSum = 0;   // ways since the forces were summed up
+    bool m_hasBefore = false;     // a way of this stage has been chosen
     std::vector<double> m_before; // forces' rates of the last way, and that of the control
     double m_beforeControl = 0.0, m_beforeLeast = 0.0;
     T_PUSH_DRIVE m_drive;

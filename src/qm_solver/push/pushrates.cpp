@@ -131,7 +131,7 @@ double CPushPath::DriveSign() const
     for (const std::size_t f : m_softFlows)
         if (!IsActive(f)) add(f);
     if (std::fabs(sum) > least) return sum > 0.0 ? 1.0 : -1.0;
-    if (m_before.empty()) return m_rate.control >= 0.0 ? 1.0 : -1.0;
+    if (!m_hasBefore) return m_rate.control >= 0.0 ? 1.0 : -1.0;
     sum = 0.0;
     double size = 0.0;
     for (std::size_t r = 0; r < m_byForce.size(); ++r) {

@@ -53,8 +53,7 @@ CPushRun::T_FAULT CPushRun::Go(std::span<const T_PUSH_STAGE> stages, T_PUSH_END&
 {
     end = {};
     bool goesOn = true;
-    if (!stages.empty())
-        m_follows = {stages[0].node, static_cast<std::size_t>(stages[0].direction)};
+    if (!stages.empty()) m_follows = {stages[0].node, WayOf(stages[0])};
     m_structure.DropLoads();
     m_structure.Stiffen();
     if (auto fault = Initial(end, goesOn)) return fault;
@@ -101,7 +100,7 @@ CPushRun::T_FAULT CPushRun::InitialPath(T_PUSH_END& end, bool& goesOn)
     m_nodeWatch.clear();
     m_driftWatch.clear();
     const T_PUSH_STAGE stage = InitialStage(m_model);
-    m_nodeWatch.push_back(m_path->Watch(m_structure.Displacement(m_follows[0], m_follows[1])));
+    m_nodeWatch.push_back(m_path->Watch(m_structure.Displacement(m_follows.node, m_follows.way)));
     if (auto fault = m_path->BeginStage(0, std::nullopt)) return fault;
     MakeTargets(stage);
     if (auto fault = Follow(stage, -1, end)) return fault;
@@ -111,7 +110,7 @@ CPushRun::T_FAULT CPushRun::InitialPath(T_PUSH_END& end, bool& goesOn)
     return {};
 }
 
-CPushRun::T_FAULT CPushRun::Stage(const T_PUSH_STAGE& stage, std::size_t number, T_PUSH_END& end,
+CPushRun::T_FAULT CPushRun::Stage(T_PUSH_STAGE stage, std::size_t number, T_PUSH_END& end,
                                   bool& goesOn)
 {
     const std::size_t set = m_structure.LoadCount();
@@ -119,9 +118,9 @@ CPushRun::T_FAULT CPushRun::Stage(const T_PUSH_STAGE& stage, std::size_t number,
     if (auto fault = m_structure.SolveLoads()) return fault;
     m_nodeWatch.clear();
     m_driftWatch.clear();
-    const auto direction = static_cast<std::size_t>(stage.direction);
+    const T_VEC6 way = WayOf(stage);
     const auto watch = [&](std::size_t node) {
-        return m_path->Watch(m_structure.Displacement(node, direction));
+        return m_path->Watch(m_structure.Displacement(node, way));
     };
     m_controlWatch = watch(stage.node);
     if (stage.control == PUSH_CONTROL::LargestTranslation)
@@ -134,19 +133,21 @@ CPushRun::T_FAULT CPushRun::Stage(const T_PUSH_STAGE& stage, std::size_t number,
         m_driftWatch.push_back({top, drift.below == T_PUSH_DRIFT::kGround ? T_PUSH_DRIFT::kGround
                                                                           : watch(drift.below)});
     }
-    std::optional<std::size_t> control;
+    double moved = 0.0; // by the load factor 1, elastically
+    m_held.reset();
     if (stage.control != PUSH_CONTROL::LoadFactor) {
-        double most = -1.0; // the node that moves most at first
         const std::vector<double>& unknowns = m_structure.Loads(set).unknowns;
         for (std::size_t w = 0; w < m_nodeWatch.size(); ++w) {
             const std::size_t node = m_nodeWatch.size() == 1 ? stage.node : w;
-            const double moved =
-                std::fabs(m_structure.Value(m_structure.Displacement(node, direction), unknowns));
-            if (moved > most) control = m_nodeWatch[w];
-            most = std::max(most, moved);
+            const double own = m_structure.Value(m_structure.Displacement(node, way), unknowns);
+            if (m_held && !(std::fabs(own) > std::fabs(moved))) continue;
+            m_held = m_nodeWatch[w];
+            moved = own;
         }
     }
-    if (auto fault = m_path->BeginStage(set, control)) return fault;
+    if (stage.control == PUSH_CONTROL::LargestTranslation)
+        stage.target = std::copysign(stage.target, moved); // where the loads go
+    if (auto fault = m_path->BeginStage(set, m_held)) return fault;
     if (auto fault = GiveStart(number)) return fault;
     MakeTargets(stage);
     if (auto fault = Follow(stage, static_cast<int>(number), end)) return fault;
@@ -206,10 +207,8 @@ CPushRun::T_FAULT CPushRun::Update(const T_PUSH_STAGE&, std::optional<double> co
 /// The event that the axial forces of the last factorisation have told, with those of here.
 CPushRun::T_FAULT CPushRun::Approach(const T_PUSH_STAGE& stage, double by)
 {
-    const double here = Present(stage);
-    if (auto fault = Update(stage, stage.control == PUSH_CONTROL::LoadFactor ? std::nullopt
-                                                                             : std::optional(here)))
-        return fault;
+    const auto here = m_held ? std::optional(m_path->Watched(*m_held)) : std::nullopt;
+    if (auto fault = Update(stage, here)) return fault;
     m_path->SetDrive({T_PUSH_DRIVE::KIND::Before, 1.0, {}});
     if (!m_path->Again()) return {};
     const double left = m_path->NextEvent(by);

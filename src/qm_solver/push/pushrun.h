@@ -29,10 +29,11 @@ private:
     bool IsUpdated() const { return m_model.pDelta == P_DELTA::Updated; }
     T_FAULT Initial(T_PUSH_END& end, bool& goesOn);
     T_FAULT InitialPath(T_PUSH_END& end, bool& goesOn);
-    T_FAULT Stage(const T_PUSH_STAGE& stage, std::size_t number, T_PUSH_END& end, bool& goesOn);
+    T_FAULT Stage(T_PUSH_STAGE stage, std::size_t number, T_PUSH_END& end, bool& goesOn);
     T_FAULT Follow(const T_PUSH_STAGE& stage, int number, T_PUSH_END& end);
     T_FAULT GiveStart(std::size_t number);
     void MakeTargets(const T_PUSH_STAGE& stage);
+    std::size_t PresentWatch() const;
     double Present(const T_PUSH_STAGE& stage) const;
     double ToTarget(const T_PUSH_STAGE& stage) const;
     double ToStop(const T_PUSH_STAGE& stage, T_PUSH_END& end) const;
@@ -54,8 +55,13 @@ private:
     CPushStructure& m_structure;
     const T_PUSH_SINK& m_sink;
     std::unique_ptr<CPushPath> m_path;
-    std::array<std::size_t, 2> m_follows{}; // node and direction that the initial loads are told by
+    struct T_FOLLOWED {
+        std::size_t node = 0;
+        T_VEC6 way{};
+    };
+    T_FOLLOWED m_follows;                   // what the initial loads are told by
     std::vector<std::size_t> m_nodeWatch;   // translations in the direction of control
+    std::optional<std::size_t> m_held;      // the one that borders the system
     std::vector<std::array<std::size_t, 2>> m_driftWatch;
     std::size_t m_controlWatch = 0; // displacement of the control node
     std::vector<double> m_extra;    // of it, where something else controls: further steps

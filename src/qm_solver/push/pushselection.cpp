@@ -252,6 +252,7 @@ CPushPath::WAY CPushPath::Select(T_FAULT& fault)
         std::vector<T_CHANGE> changes = Violations();
         if (changes.empty()) {
             NoteTurns(false);
+            m_hasBefore = true;
             m_before = m_rate.force;
             m_beforeControl = m_rate.control;
             m_beforeLeast = Least();

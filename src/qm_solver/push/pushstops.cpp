@@ -10,15 +10,29 @@ namespace {
 
 constexpr double kOnTarget = 1e-12; // of the way to the target
 
+double Along(const T_VEC6& way, const T_VEC6& what)
+{
+    double sum = 0.0;
+    for (std::size_t d = 0; d < way.size(); ++d)
+        sum += way[d] * what[d];
+    return sum;
+}
+
 } // namespace
+
+/// The control displacement: of several nodes that of the one furthest on the way.
+std::size_t CPushRun::PresentWatch() const
+{
+    return *std::max_element(m_nodeWatch.begin(), m_nodeWatch.end(),
+                             [&](std::size_t a, std::size_t b) {
+                                 return m_sign * m_path->Watched(a) < m_sign * m_path->Watched(b);
+                             });
+}
 
 double CPushRun::Present(const T_PUSH_STAGE& stage) const
 {
     if (stage.control == PUSH_CONTROL::LoadFactor) return m_path->Factor();
-    double most = m_path->Watched(m_nodeWatch[0]);
-    for (const std::size_t w : m_nodeWatch)
-        if (m_sign * m_path->Watched(w) > m_sign * most) most = m_path->Watched(w);
-    return most;
+    return m_path->Watched(PresentWatch());
 }
 
 void CPushRun::MakeTargets(const T_PUSH_STAGE& stage)
@@ -112,13 +126,13 @@ double CPushRun::ToExtra(std::size_t& found) const
 
 double CPushRun::Reaction(const T_PUSH_STAGE& stage) const
 {
-    return -Base()[static_cast<std::size_t>(stage.direction)];
+    return -Along(WayOf(stage), Base());
 }
 
 double CPushRun::ReactionRate(const T_PUSH_STAGE& stage) const
 {
-    return m_path->Rate().factor * m_structure.Loads(m_structure.LoadCount() - 1)
-                                       .sum[static_cast<std::size_t>(stage.direction)];
+    const T_VEC6& sum = m_structure.Loads(m_structure.LoadCount() - 1).sum;
+    return m_path->Rate().factor * Along(WayOf(stage), sum);
 }
 
 /// What the supports give, from the loads.
@@ -203,11 +217,12 @@ bool CPushRun::StopsHere(const T_PUSH_STAGE& stage, T_PUSH_END& end)
     if (StopsAtHinge(stage.stops, end)) return true;
     if (IsBehind(stage)) return false;
     const T_PUSH_STOPS& stops = stage.stops;
-    const double moved = m_path->WatchRate(m_nodeWatch[0]);
+    const double moved = m_path->WatchRate(PresentWatch());
     if (moved != 0.0) {
         const double tangent = ReactionRate(stage) / moved;
         if (m_peak.first == 0.0) m_peak.first = tangent;
-        const bool isForwards = m_sign * moved > 0.0;
+        const bool isForwards =
+            stage.control == PUSH_CONTROL::LoadFactor || m_sign * moved > 0.0;
         if (stops.stiffnessRatio > 0.0 && isForwards &&
             tangent <= stops.stiffnessRatio * m_peak.first) {
             end.outcome = PUSH_OUTCOME::StiffnessStop;

@@ -313,10 +313,14 @@ CPushStructure::T_FAULT CPushStructure::Columns(std::span<const std::size_t> row
     return {};
 }
 
-T_PROBE CPushStructure::Displacement(std::size_t node, std::size_t direction) const
+T_PROBE CPushStructure::Displacement(std::size_t node, const T_VEC6& way) const
 {
-    const auto terms = m_dofs.Terms(6 * node + direction);
-    return {terms.begin(), terms.end()};
+    T_PROBE out;
+    for (std::size_t d = 0; d < 6; ++d)
+        if (way[d] != 0.0)
+            for (const T_TERM& t : m_dofs.Terms(6 * node + d))
+                out.push_back({t.index, way[d] * t.factor});
+    return out;
 }
 
 double CPushStructure::Value(const T_PROBE& probe, std::span<const double> unknowns) const
@@ -325,12 +329,6 @@ double CPushStructure::Value(const T_PROBE& probe, std::span<const double> unkno
     for (const T_TERM& t : probe)
         sum += t.factor * unknowns[static_cast<std::size_t>(t.index)];
     return sum;
-}
-
-double CPushStructure::Settled(std::size_t set, std::size_t node, std::size_t direction) const
-{
-    const auto settled = m_loads[set].loads->Settled();
-    return settled.empty() ? 0.0 : settled[6 * node + direction];
 }
 
 } // namespace solver

@@ -84,10 +84,9 @@ public:
     /// column after the other, solved in one block.
     T_FAULT Columns(std::span<const std::size_t> rows, std::span<const T_PROBE> probes,
                     std::vector<double>& forces, std::vector<double>& values);
-    T_PROBE Displacement(std::size_t node, std::size_t direction) const;
+    /// Displacement of a node along a way, by factors of its six directions.
+    T_PROBE Displacement(std::size_t node, const T_VEC6& way) const;
     double Value(const T_PROBE& probe, std::span<const double> unknowns) const;
-    /// What settlements add to the displacement of a node.
-    double Settled(std::size_t set, std::size_t node, std::size_t direction) const;
 
     /// Displacements of all nodes of states, reactions, axial forces at hinges and the residual,
     /// one solve for all.

@@ -44,6 +44,27 @@ std::vector<T_END_CASE> EndCases()
     load.stage.steps = {0.25, 0.5, 0.75, 1.0};
     add("largest translation", ideal, PUSH_OUTCOME::Reached, 50.0, 3.0).stage.control =
         PUSH_CONTROL::LargestTranslation;
+    const auto against = [](T_END_CASE& c, PUSH_CONTROL control, double target) {
+        c.stage.loads.nodal[0].load[0] = -1.0;
+        c.stage.control = control;
+        c.stage.target = target;
+    };
+    against(add("largest translation the other way", ideal, PUSH_OUTCOME::Reached, 50.0, -3.0),
+            PUSH_CONTROL::LargestTranslation, 3.0);
+    T_END_CASE& other = add("stiffness the other way, by load", YieldingColumn({{0, 100}, {1, 200}}),
+                            PUSH_OUTCOME::StiffnessStop, 50.0, -4.0 / 3.0);
+    against(other, PUSH_CONTROL::LoadFactor, 80.0);
+    other.stage.stops.stiffnessRatio = 0.7;
+    T_END_CASE& elastic = add("no hinges, back", Column(), PUSH_OUTCOME::Reached, -3.75, -0.1);
+    elastic.stage.target = -0.1;
+    elastic.stage.steps = {0.5, 1.0};
+    for (const PUSH_CONTROL control : {PUSH_CONTROL::Displacement, PUSH_CONTROL::LargestTranslation}) {
+        T_END_CASE& slanted = add("across the axes", Column(), PUSH_OUTCOME::Reached, 30.0, 0.8);
+        slanted.stage.control = control;
+        slanted.stage.along = {0.6, 0.8, 0.0};
+        slanted.stage.loads.nodal[0].load = {0.6, 0.8, 0.0, 0.0, 0.0, 0.0};
+        slanted.stage.target = 0.8;
+    }
     add("drift", ideal, PUSH_OUTCOME::DriftStop, 37.5, 1.0).stage.stops.drift = 0.5;
     cases.back().model.drifts.push_back({1, T_PUSH_DRIFT::kGround, 2.0});
     add("mark", ideal, PUSH_OUTCOME::MarkStop, 50.0, 4.0 / 3.0 + 0.04).stage.stops.mark = 1;
