@@ -67,6 +67,8 @@ EXIT_CODE WritePicture(const T_PLOT& plot, const std::string& path)
 
 EXIT_CODE SaveDocument(CDBDoc& doc, const std::string& path)
 {
+    if (const std::string fault = doc.Data().Fault(); !fault.empty())
+        return Complain(EXIT_CODE::Usage, fault);
     T_FILE_ERROR error;
     const int done =
         CFileCtrl::IsModelName(path) ? doc.SaveModelAs(path, error) : doc.ExportCase(path, error);

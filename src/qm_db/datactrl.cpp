@@ -1,5 +1,7 @@
 #include "qm_db/datactrl.h"
 
+#include "qm_db/records/modelfault.h"
+
 #include "qm_db/editscope.h"
 #include "qm_db/records/lcomflatten.h"
 
@@ -39,6 +41,11 @@ void CDataCtrl::SetStaticResult(int loadCase, std::shared_ptr<IStaticResult> res
     ++m_revision;
 }
 
+std::string CDataCtrl::Fault() const
+{
+    return ModelFault(m_content.model);
+}
+
 void CDataCtrl::SetPushRuns(int pushover, const std::vector<std::shared_ptr<IPushRun>>& runs)
 {
     T_RESULT_MAP& results = m_content.results;
@@ -51,6 +58,7 @@ void CDataCtrl::SetPushRuns(int pushover, const std::vector<std::shared_ptr<IPus
             results[pushover] = run;
         else
             m_content.turnedResults[{pushover, turn}] = run;
+    m_content.model.poverSteps.erase(pushover); // they number the steps of the run before
     ChangeForGood();
     ++m_revision;
 }

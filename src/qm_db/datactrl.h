@@ -21,6 +21,8 @@ public:
 
     /// Puts the runs of one pushover load case, one for each turn of its loads, in place of all
     /// that it has; results of another solver go when there is one that is not turned.
+    /// The first record that a file could not hold, in words; empty: all can.
+    std::string Fault() const;
     void SetPushRuns(int pushover, const std::vector<std::shared_ptr<IPushRun>>& runs);
 
     /// Results of the construction stages; null where there are none.

@@ -28,6 +28,9 @@ void WriteMore(CJsonWriter& out, const T_MODEL_CONTENT& content, int key, const 
         WriteSteps(out, *content.results.at(key), push.direction);
     else if (!push.control)
         out.Fail("IDS_QM_CASE_NO_RESULTS", push.name);
+    const auto own = content.results.find(key);
+    if (own != content.results.end() && own->second && own->second->Run())
+        return; // limit states number steps that the file does not hold
     const auto steps = content.model.poverSteps.find(key);
     if (out.Failed() || steps == content.model.poverSteps.end()) return;
     CCasePut put(out);

@@ -128,6 +128,8 @@ private:
             return Fail(error, Say("IDS_QM_PUSH_ECCENTRICITY"));
         if (m_choice.target && !(std::isfinite(*m_choice.target) && *m_choice.target > 0.0))
             return Fail(error, Say("IDS_QM_PUSH_GEN_TARGET"));
+        if (!m_choice.directions[0] && !m_choice.directions[1])
+            return Fail(error, Say("IDS_QM_PUSH_GEN_NO_DIRECTION"));
         if (wanted.empty()) return Fail(error, Say("IDS_QM_PUSH_GEN_NOTHING"));
         for (const T_WANTED& w : wanted)
             for (const auto& [key, other] : m_model.pushovers)
@@ -255,7 +257,11 @@ private:
         out.control.emplace().masterMaxDispl = w.sign * m_basis.target;
         if (!MakePattern(w, out.patterns.emplace_back(), error)) return 0;
         TakeMasterPattern(out);
-        return 1;
+        if (out.eccentricity == 0.0) return 1;
+        T_POLC_D probe = out; // whether the storeys give the eccentricity an effect
+        probe.patterns = {{kUniform, out.direction, static_cast<double>(w.sign)}};
+        solver::T_LOAD_CASE loads;
+        return BuildPattern(m_model, m_frame, probe, {}, loads, error);
     }
 
     CDBDoc& m_doc;

@@ -67,6 +67,8 @@ public:
         const T_POGC_D control = PushControlOf(m_model, record);
         solver::T_PUSH_STAGE stage;
         if (!FindControl(record, stage, error)) return 0;
+        const double ratio = record.control->stiffnessRatioLimit;
+        if (!(ratio >= 0.0 && ratio < 1.0)) return Fail(error, Say("IDS_QM_PUSH_CASE_RATIO"));
         T_PUSH_INCREMENTS increments = EqualIncrements(control.steps);
         if (record.control->incrementOption == kFollowsFunction) {
             const auto f = m_model.incrementFunctions.find(record.control->incrementFunction);
