@@ -69,6 +69,7 @@ enum class PUSH_OUTCOME {
     TooManyEvents,
     OutOfBalance, // a step does not keep equilibrium
     Cancelled,
+    Mechanism, // that does not move the control node, under loads that can't grow
 };
 
 struct T_PUSH_END {

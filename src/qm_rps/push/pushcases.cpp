@@ -148,9 +148,9 @@ int Turn(const CAnalysisModel& frame, double step, int times, T_PUSH_CASE& c, st
     c.name += "@" + FormatText("%g", angle);
     for (const std::size_t d : {0U, 1U})
         if (c.along[d] != 0.0 && frame.Frame().nodes[c.controlNode].fixed[d])
-            return Fail(error, Say("IDS_QM_PUSH_CASE_FIXED",
-                                   std::to_string(frame.NodeIds()[c.controlNode]),
-                                   kDirectionNames[d]));
+            return Fail(error,
+                        Say("IDS_QM_PUSH_CASE_FIXED",
+                            std::to_string(frame.NodeIds()[c.controlNode]), kDirectionNames[d]));
     return 1;
 }
 
@@ -226,7 +226,8 @@ int BuildPushCases(const T_MODEL& model, const CAnalysisModel& frame, const std:
     } else {
         const double angle = record.control->staticAngle;
         constexpr double kLeast = 1.0; // degrees: 359 directions
-        if (!(angle >= kLeast && angle < 360.0)) return Fail(error, Say("IDS_QM_PUSH_CASE_ANGLE_SMALL"));
+        if (!(angle >= kLeast && angle < 360.0))
+            return Fail(error, Say("IDS_QM_PUSH_CASE_ANGLE_SMALL"));
         for (int i = 1; i * angle < 360.0; ++i)
             if (!Turn(frame, angle, i, cases.emplace_back(c), error)) return 0;
     }

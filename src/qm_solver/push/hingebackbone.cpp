@@ -151,6 +151,26 @@ void CHingeBackbone::Flow(double by)
     if (m_on == ON::Virgin) m_furthest = m_flowed;
 }
 
+double CHingeBackbone::ShareRoom() const
+{
+    const std::size_t next = std::max<std::size_t>(1, m_vertex);
+    return next < m_points.size() ? std::max(0.0, m_points[next].flowed - m_flowed) : kFar;
+}
+
+double CHingeBackbone::ShareSlope() const
+{
+    return ShareRoom() > 0.0 ? SlopeOf(std::max<std::size_t>(1, m_vertex)) : 0.0;
+}
+
+void CHingeBackbone::Share(double by)
+{
+    if (!(by > 0.0)) return;
+    m_vertex = std::max<std::size_t>(1, m_vertex);
+    const double room = ShareRoom();
+    m_flowed = by < room ? m_flowed + by : m_points[m_vertex].flowed;
+    m_furthest = m_flowed;
+}
+
 /// At the furthest deformation, on its way on: past all vertices that lie there.
 void CHingeBackbone::EnterVirgin()
 {
@@ -170,6 +190,7 @@ void CHingeBackbone::EnterVirgin()
 
 void CHingeBackbone::Start(bool forwards)
 {
+    m_begun = true;
     if (forwards && m_flowed >= m_furthest) {
         EnterVirgin();
         return;

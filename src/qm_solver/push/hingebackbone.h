@@ -45,6 +45,15 @@ public:
     /// Plastic deformation to the end of the branch; kFar: it has none that way.
     double Room(bool forwards) const;
     void Flow(double by);
+    /// Locked: what flow of a neighbouring face adds to its deformation, up to its next vertex.
+    void Share(double by);
+    /// ... room for it, and the change of Upper by it.
+    double ShareRoom() const;
+    double ShareSlope() const;
+    /// Faces that go with each other: those that unload elastically.
+    bool CanShare() const { return !IsReversible(); }
+    /// It has begun to flow itself, not by its neighbours alone.
+    bool HasBegun() const { return m_begun; }
 
     /// Begins to move from Locked (at Upper or Lower), or turns from Back into what lies beyond.
     void Start(bool forwards);
@@ -81,8 +90,9 @@ private:
     double m_furthest = 0.0; // of the backbone; with a gap its end at first
     std::size_t m_vertex = 0;
     std::size_t m_start = 0; // 1: the first point is the origin, not a vertex of the law
-    bool m_broken = false;   // a drop lies behind: there is no way back along the backbone
-    std::size_t m_back = 0;  // part of the backbone on the way back of a nonlinear elastic side
+    bool m_begun = false;
+    bool m_broken = false;  // a drop lies behind: there is no way back along the backbone
+    std::size_t m_back = 0; // part of the backbone on the way back of a nonlinear elastic side
 };
 
 } // namespace solver

@@ -57,12 +57,45 @@ double CPushPath::FlowRate(std::size_t f) const
     return rate;
 }
 
+bool CPushPath::IsShared(std::size_t f) const
+{
+    return Backbone(f).On() == ON::Locked && !m_flows.flows[f].mates.empty();
+}
+
+double CPushPath::ShareOf(std::size_t f, std::size_t other) const
+{
+    if (Backbone(other).On() != ON::Virgin) return 0.0;
+    for (const CPushFlow::T_MATE& mate : m_flows.flows[f].mates)
+        if (mate.flow == other) return mate.share;
+    return 0.0;
+}
+
+double CPushPath::MeasureRate(std::size_t f) const
+{
+    double rate = FlowRate(f);
+    for (const CPushFlow::T_MATE& mate : m_flows.flows[f].mates)
+        if (IsActive(mate.flow) && Backbone(mate.flow).On() == ON::Virgin)
+            rate += mate.share * m_rate.flow[m_place[mate.flow] - 1];
+    return rate;
+}
+
 /// unknowns: of the active flows; forces: changes of the rows.
 void CPushPath::MoveFlows(std::span<const double> unknowns, std::span<const double> forces,
                           double by)
 {
-    for (std::size_t k = 0; k < m_active.size(); ++k)
-        if (m_soft[m_active[k]] == 0.0) Backbone(m_active[k]).Flow(by * unknowns[k]);
+    std::map<std::size_t, double> shared;
+    for (std::size_t k = 0; k < m_active.size(); ++k) {
+        const std::size_t f = m_active[k];
+        if (m_soft[f] == 0.0) Backbone(f).Flow(by * unknowns[k]);
+        for (const CPushFlow::T_MATE& mate : m_flows.flows[f].mates)
+            if (const double share = ShareOf(mate.flow, f); share > 0.0)
+                shared[mate.flow] += by * share * unknowns[k];
+    }
+    for (const auto& [f, flowed] : shared)
+        if (Backbone(f).On() == ON::Virgin)
+            Backbone(f).Flow(flowed);
+        else if (IsShared(f))
+            Backbone(f).Share(flowed);
     for (const std::size_t f : m_softFlows) {
         if (!IsMoving(f)) continue;
         const double own = IsActive(f) ? unknowns[m_place[f] - 1] : 0.0;

@@ -60,13 +60,18 @@ void CPushPath::UpdateLock(std::size_t f)
             flow.force,       true};
 }
 
-double CPushPath::LoadRate() const
+double CPushPath::LoadSize() const
 {
     const std::vector<double>& loads = m_structure.Loads(m_factors.size() - 1).force;
     double most = 0.0;
     for (std::size_t r = 0; r < loads.size(); ++r)
         most = std::max(most, std::fabs(loads[r]) * m_byForce[r]);
-    const double rate = m_rate.factor * most;
+    return most;
+}
+
+double CPushPath::LoadRate() const
+{
+    const double rate = m_rate.factor * LoadSize();
     return std::fabs(rate) >= kMechanism * m_norm ? rate : 0.0;
 }
 
@@ -192,7 +197,12 @@ double CPushPath::NextEvent(double back) const
         const bool flows = IsMoving(f);
         const double rate = flows ? FlowRate(f) : PhiRate(f);
         const double size = rate * (flows ? flow.stiffness : 1.0) / flow.force;
-        if (flows && size > least) take(backbone.Room(true), rate);
+        const double measure = flow.mates.empty() ? rate : MeasureRate(f);
+        if (flows && measure * flow.stiffness / flow.force > least)
+            take(backbone.Room(true), measure);
+        if (IsShared(f) && backbone.ShareRoom() > 0.0 &&
+            measure * flow.stiffness / flow.force > least)
+            take(backbone.ShareRoom(), measure);
         if (flows && size < -least && backbone.On() == ON::Back) take(backbone.Room(false), -rate);
         if (backbone.On() == ON::Locked && size > least) take(-Phi(f, backbone.Upper()), rate);
         if (backbone.On() == ON::Locked && size < -least &&
@@ -252,7 +262,8 @@ long CPushPath::Turn()
             break;
         case ON::Virgin:
         case ON::Back:
-            if (size > least && backbone.Room(true) <= close)
+            if (MeasureRate(f) * flow.stiffness > least * flow.force &&
+                backbone.Room(true) <= close)
                 turn([&] { backbone.End(true); });
             else if (backbone.On() == ON::Back && size < -least && backbone.Room(false) <= close)
                 turn([&] { backbone.End(false); });
@@ -362,7 +373,8 @@ std::vector<T_HINGE_STATE> CPushPath::HingeStates() const
     for (std::size_t f = 0; f < m_flows.flows.size(); ++f) {
         const CPushFlow& flow = m_flows.flows[f];
         int& most = vertex[m_firstLaw[flow.hinge] + flow.law][flow.positive ? 0 : 1];
-        most = std::max(most, Backbone(f).Vertex());
+        if (flow.mates.empty() || Backbone(f).HasBegun())
+            most = std::max(most, Backbone(f).Vertex());
     }
     std::vector<T_HINGE_STATE> out;
     out.reserve(m_lawCount);

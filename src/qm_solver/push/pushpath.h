@@ -94,6 +94,8 @@ public:
     /// Plastic and elastic part of the deformation of a law, and its rate.
     double Deformation(std::size_t hinge, std::size_t law, double& rate) const;
     const T_PUSH_FLOWS& Flows() const { return m_flows; }
+    /// The path moves neither the load factor nor the control displacement.
+    bool IsElsewhere() const;
     /// The loads grow along the rates.
     bool LoadGrows() const { return LoadRate() > 0.0 || (m_rate.factor > 0.0 && m_norm == 0.0); }
     /// Conditions hang on the axial force in more than a straight way: steps need Correct.
@@ -139,6 +141,8 @@ private:
     // pushpath.cpp
     /// Rate of the loads as that of the elastic forces that they make; 0 in a mechanism.
     double LoadRate() const;
+    /// Largest elastic force by the loads over its strength, at the load factor 1.
+    double LoadSize() const;
     T_FAULT Rebuild();
     T_FAULT Rebase();
     void SumUp();
@@ -148,6 +152,11 @@ private:
     bool IsFolded(std::size_t flow) const;
     bool BelongsInSystem(std::size_t flow) const;
     double FlowRate(std::size_t flow) const;
+    /// ... with what flows of its mates give it: the rate along its backbone.
+    double MeasureRate(std::size_t flow) const;
+    /// Part of the flow of an active one that counts for this one.
+    double ShareOf(std::size_t flow, std::size_t other) const;
+    bool IsShared(std::size_t flow) const;
     /// Condition of an active flow: alpha rate of its force = beta rate of its unknown.
     double Alpha(std::size_t flow) const;
     double Beta(std::size_t flow) const;

@@ -144,6 +144,19 @@ double CPushPath::DriveSign() const
     return m_rate.control * m_beforeControl >= 0.0 ? 1.0 : -1.0; // nothing resisted before
 }
 
+bool CPushPath::IsElsewhere() const
+{
+    if (!m_control || m_norm == 0.0 || LoadRate() != 0.0) return false;
+    const T_WATCH& watch = m_watches[*m_control];
+    // what elastic forces of the size of these rates would move it by
+    const double loads = LoadSize();
+    double size = loads > 0.0 ? std::fabs(watch.byLoads.back()) * m_norm / loads : 0.0;
+    for (std::size_t r = 0; r < m_rate.plastic.size(); ++r)
+        if (m_rate.plastic[r] != 0.0)
+            size += std::fabs(m_rate.plastic[r] * m_columnOf[r]->watch[*m_control]);
+    return std::fabs(watch.rate) <= kLeastRate * size;
+}
+
 int CPushPath::MakeRates()
 {
     std::vector<double> x;

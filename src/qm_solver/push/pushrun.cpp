@@ -271,7 +271,7 @@ CPushRun::T_FAULT CPushRun::Follow(const T_PUSH_STAGE& stage, int number, T_PUSH
     const auto finish = [&](PUSH_OUTCOME outcome) -> T_FAULT {
         // The last state that stands is a step, too.
         const bool isStep = outcome == PUSH_OUTCOME::NoEquilibrium ||
-                            outcome == PUSH_OUTCOME::NoPath ||
+                            outcome == PUSH_OUTCOME::NoPath || outcome == PUSH_OUTCOME::Mechanism ||
                             outcome == PUSH_OUTCOME::AxialStrength;
         if (isStep && number >= 0 && m_path->Factor() != m_stored && !IsBehind(stage)) {
             if (auto fault = m_path->Correct(std::nullopt)) return fault;
@@ -305,6 +305,8 @@ CPushRun::T_FAULT CPushRun::Follow(const T_PUSH_STAGE& stage, int number, T_PUSH
         }
         if (found == CPushPath::WAY::None || (byLoad && !m_path->LoadGrows()))
             return finish(byLoad ? PUSH_OUTCOME::NoEquilibrium : PUSH_OUTCOME::NoPath);
+        if (stage.control == PUSH_CONTROL::Displacement && m_path->IsElsewhere())
+            return finish(PUSH_OUTCOME::Mechanism);
         if (number >= 0 && StopsHere(stage, end)) {
             if (m_path->Factor() != 0.0 && (fault = Store(stage, number, false, end))) return fault;
             return finish(end.outcome);

@@ -59,9 +59,9 @@ private:
         std::size_t node = 0;
         T_VEC6 way{};
     };
-    T_FOLLOWED m_follows;                   // what the initial loads are told by
-    std::vector<std::size_t> m_nodeWatch;   // translations in the direction of control
-    std::optional<std::size_t> m_held;      // the one that borders the system
+    T_FOLLOWED m_follows;                 // what the initial loads are told by
+    std::vector<std::size_t> m_nodeWatch; // translations in the direction of control
+    std::optional<std::size_t> m_held;    // the one that borders the system
     std::vector<std::array<std::size_t, 2>> m_driftWatch;
     std::size_t m_controlWatch = 0; // displacement of the control node
     std::vector<double> m_extra;    // of it, where something else controls: further steps

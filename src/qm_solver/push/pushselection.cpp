@@ -40,6 +40,9 @@ double CPushPath::PhiRate(std::size_t f) const
     double rate = 0.0;
     for (const T_FLOW_TERM& t : flow.Gradient(m_force, Resistance(f)))
         rate += t.factor * m_rate.force[t.row];
+    if (IsShared(f)) // its limit moves, too
+        rate -= m_flows.flows[f].Scale(m_force) * Backbone(f).ShareSlope() *
+                std::max(0.0, MeasureRate(f));
     return rate;
 }
 
@@ -113,6 +116,10 @@ CPushPath::T_FAULT CPushPath::Activate(std::size_t f)
         for (const T_FLOW_TERM& g : gradient)
             for (const T_FLOW_TERM& d : other.Direction(m_force, theirs))
                 row[k + 1] -= alpha * g.factor * d.factor * m_columnOf[d.row]->force[g.row];
+        if (!flow.mates.empty()) {
+            row[k + 1] += ShareOf(f, m_active[k]) * Beta(f);
+            column[k + 1] += ShareOf(m_active[k], f) * Beta(m_active[k]);
+        }
         for (const T_FLOW_TERM& g : other.Gradient(m_force, theirs))
             for (const T_FLOW_TERM& d : direction)
                 column[k + 1] -= theirAlpha * g.factor * d.factor * m_columnOf[d.row]->force[g.row];
@@ -211,6 +218,7 @@ CPushPath::T_FAULT CPushPath::Apply(const T_CHANGE& change)
     case KIND::Part: // chosen already
         break;
     }
+    if (backbone.On() == ON::Drop) TakeDrive({&change.flow, 1});
     return Sync(change.flow);
 }
 
@@ -237,6 +245,11 @@ void CPushPath::NoteTurns(bool isEnd)
             note(HINGE_TURN::Point, v);
         told = std::max(told, now.Vertex());
         if (isEnd || now.Vertex() != was.vertex) continue;
+        // From one face to the next: the hinge goes on.
+        if (std::ranges::any_of(flow.mates, [&](const CPushFlow::T_MATE& mate) {
+                return Backbone(mate.flow).On() == ON::Virgin;
+            }))
+            continue;
         const bool wasOn = was.on == ON::Virgin, isOn = now.On() == ON::Virgin;
         if (wasOn && !isOn && now.On() != ON::Drop) note(HINGE_TURN::Unload, now.Vertex());
         if (!wasOn && isOn && was.on != ON::Drop) note(HINGE_TURN::Reload, now.Vertex());

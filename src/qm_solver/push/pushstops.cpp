@@ -221,8 +221,7 @@ bool CPushRun::StopsHere(const T_PUSH_STAGE& stage, T_PUSH_END& end)
     if (moved != 0.0) {
         const double tangent = ReactionRate(stage) / moved;
         if (m_peak.first == 0.0) m_peak.first = tangent;
-        const bool isForwards =
-            stage.control == PUSH_CONTROL::LoadFactor || m_sign * moved > 0.0;
+        const bool isForwards = stage.control == PUSH_CONTROL::LoadFactor || m_sign * moved > 0.0;
         if (stops.stiffnessRatio > 0.0 && isForwards &&
             tangent <= stops.stiffnessRatio * m_peak.first) {
             end.outcome = PUSH_OUTCOME::StiffnessStop;

@@ -3,6 +3,8 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
+
 #include <cmath>
 
 namespace {
@@ -105,11 +107,12 @@ TEST(PushLaws, FollowsEveryLawForwardsAndBack)
 
 TEST(PushLaws, BendsAboutBothAxesWithinOnePolygon)
 {
-    // The polygon has its 16 vertices on the circle of radius 100: at 45 degrees it carries 100,
-    // midway between vertices 100 cos(pi / 16).
-    const double pi = std::acos(-1.0);
-    for (const auto& [angle, moment] :
-         {std::pair{pi / 4.0, 100.0}, {0.0, 100.0}, {pi / 16.0, 100.0 * std::cos(pi / 16.0)}}) {
+    // Faces across the axes reach 3 degrees to both sides; four chords of 21 degrees lie between
+    // their corners, on the circle of radius 100 / cos(3 degrees): 45 degrees is a corner, too.
+    const double degree = std::acos(-1.0) / 180.0, corner = 100.0 / std::cos(3.0 * degree);
+    for (const auto& [angle, moment] : {std::pair{45.0 * degree, corner},
+                                        {0.0, 100.0},
+                                        {13.5 * degree, corner * std::cos(10.5 * degree)}}) {
         T_PUSH_MODEL model = Column();
         T_PUSH_HINGE hinge;
         for (const int component : {4, 5})
@@ -123,6 +126,62 @@ TEST(PushLaws, BendsAboutBothAxesWithinOnePolygon)
         ASSERT_EQ(run.steps.size(), 1u);
         EXPECT_NEAR(2.0 * run.steps[0].loadFactor, moment, 1e-8) << angle;
     }
+}
+
+T_PUSH_MODEL BiaxialColumn(const T_HINGE_SIDE& side, bool biaxial)
+{
+    T_PUSH_MODEL model = Column();
+    T_PUSH_HINGE hinge;
+    for (const int component : {4, 5})
+        hinge.laws.push_back(
+            {component, side, side, 0.0, {{-200, 50, 50}, {0, 100, 100}, {200, 0, 0}}});
+    hinge.biaxial = biaxial;
+    model.hinges.push_back(hinge);
+    return model;
+}
+
+/// C, drop, residual: about one axis the hinge is the one of that axis alone.
+TEST(PushLaws, BiaxialHingeTurnsAboutOneAxisAsOneOfThatAxis)
+{
+    const T_HINGE_SIDE side = Side({{0, 100}, {0.1, 120}, {0.1, 40}, {0.3, 40}});
+    for (const int direction : {0, 1})
+        for (const double sign : {1.0, -1.0}) {
+            T_PUSH_STAGE stage = PushTo(2.0 * sign, 1, direction);
+            stage.loads.nodal[0].load[2] = -0.5 * sign;
+            for (int k = 1; k <= 40; ++k)
+                stage.steps.push_back(k / 40.0);
+            const T_PUSHED both = Pushed(BiaxialColumn(side, true), {stage});
+            const T_PUSHED one = Pushed(BiaxialColumn(side, false), {stage});
+            ASSERT_EQ(both.steps.size(), 40u) << direction;
+            ASSERT_EQ(one.steps.size(), 40u);
+            for (std::size_t k = 0; k < 40; ++k)
+                EXPECT_NEAR(both.steps[k].loadFactor, one.steps[k].loadFactor, 1e-8) << k;
+            ASSERT_EQ(both.events.size(), one.events.size());
+            for (std::size_t k = 0; k < one.events.size(); ++k)
+                EXPECT_NEAR(both.events[k].displacement, one.events[k].displacement, 1e-9);
+        }
+}
+
+/// Across both axes two faces flow alike; each takes its part of the whole rotation, so that C is
+/// there at 0.1 / cos(10.5 degrees), half a chord away from both normals, and not at twice 0.1.
+TEST(PushLaws, FacesOfABiaxialHingeShareItsRotation)
+{
+    T_PUSH_MODEL model = BiaxialColumn(Side({{0, 100}, {0.1, 120}, {0.1, 40}, {0.3, 40}}), true);
+    for (T_HINGE_LAW& law : model.hinges[0].laws)
+        law.byAxial.clear();
+    T_PUSH_STAGE stage = PushTo(1.5);
+    stage.loads.nodal[0].load = {1.0, 1.0, 0, 0, 0, 0};
+    const double degree = std::acos(-1.0) / 180.0, rotation = 0.1 / std::cos(10.5 * degree);
+    const T_PUSHED run = Pushed(model, {stage});
+    ASSERT_TRUE(run.done);
+    const auto peak = std::max_element(
+        run.events.begin(), run.events.end(),
+        [](const T_PUSH_EVENT& a, const T_PUSH_EVENT& b) { return a.loadFactor < b.loadFactor; });
+    ASSERT_NE(peak, run.events.end());
+    const double force = peak->loadFactor,
+                 turned = 0.5 * (peak->displacement - force * 8.0 / 300.0);
+    EXPECT_NEAR(force * 2.0 * std::sqrt(2.0), 120.0 / std::cos(3.0 * degree), 1e-7);
+    EXPECT_NEAR(turned * std::sqrt(2.0), rotation, 1e-9);
 }
 
 TEST(PushLaws, StrengthFollowsTheAxialForce)

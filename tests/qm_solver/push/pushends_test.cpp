@@ -51,14 +51,16 @@ std::vector<T_END_CASE> EndCases()
     };
     against(add("largest translation the other way", ideal, PUSH_OUTCOME::Reached, 50.0, -3.0),
             PUSH_CONTROL::LargestTranslation, 3.0);
-    T_END_CASE& other = add("stiffness the other way, by load", YieldingColumn({{0, 100}, {1, 200}}),
-                            PUSH_OUTCOME::StiffnessStop, 50.0, -4.0 / 3.0);
+    T_END_CASE& other =
+        add("stiffness the other way, by load", YieldingColumn({{0, 100}, {1, 200}}),
+            PUSH_OUTCOME::StiffnessStop, 50.0, -4.0 / 3.0);
     against(other, PUSH_CONTROL::LoadFactor, 80.0);
     other.stage.stops.stiffnessRatio = 0.7;
     T_END_CASE& elastic = add("no hinges, back", Column(), PUSH_OUTCOME::Reached, -3.75, -0.1);
     elastic.stage.target = -0.1;
     elastic.stage.steps = {0.5, 1.0};
-    for (const PUSH_CONTROL control : {PUSH_CONTROL::Displacement, PUSH_CONTROL::LargestTranslation}) {
+    for (const PUSH_CONTROL control :
+         {PUSH_CONTROL::Displacement, PUSH_CONTROL::LargestTranslation}) {
         T_END_CASE& slanted = add("across the axes", Column(), PUSH_OUTCOME::Reached, 30.0, 0.8);
         slanted.stage.control = control;
         slanted.stage.along = {0.6, 0.8, 0.0};
@@ -86,6 +88,16 @@ std::vector<T_END_CASE> EndCases()
         .stage.stops.fractionOfPeak = 0.5;
     add("drop below the part", beside, PUSH_OUTCOME::PeakFractionStop, 400.0 / 3.0, 4.0 / 3.0)
         .stage.stops.fractionOfPeak = 0.8;
+    // Two columns apart, both loaded by 1; the second is stronger and controls: at 50 the first one
+    // turns without end.
+    T_END_CASE& apart = add("mechanism elsewhere", ideal, PUSH_OUTCOME::Mechanism, 50.0, 4.0 / 3.0);
+    AddNode(apart.model.frame, {3, 0, 0});
+    AddNode(apart.model.frame, {3, 0, 2});
+    Fix(apart.model.frame, 2, {0, 1, 2, 3, 4, 5});
+    Join(apart.model.frame, ELEMENT_KIND::Beam, 2, 3);
+    apart.stage.node = 3;
+    apart.stage.loads.nodal.push_back(apart.stage.loads.nodal[0]);
+    apart.stage.loads.nodal[1].node = 3;
     T_END_CASE& initial = add("initial loads", ideal, PUSH_OUTCOME::InitialLoads, 0.625, 4.0 / 3.0);
     initial.model.initial = PushTo(1.0).loads;
     initial.model.initial.nodal[0].load[0] = 80.0;
