@@ -36,6 +36,8 @@ enum class HINGE_TURN {
     Point,  // reached a vertex of its backbone: `point` counts from 1 (yield)
     Unload, // left the backbone
     Reload, // came back to it
+    Slip,   // began to move without force
+    Contact // came to the end of its gap, or of its slip
 };
 
 struct T_HINGE_EVENT {

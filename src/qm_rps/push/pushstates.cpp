@@ -32,8 +32,8 @@ PUSH_STATE StateOf(const T_PUSH_LAW_PLACE& place, const solver::T_HINGE_LAW& law
 
 std::string EventTarget(const T_PUSH_LAW_PLACE& place, const solver::T_HINGE_EVENT& event)
 {
-    if (event.turn == solver::HINGE_TURN::Unload) return "unload";
-    if (event.turn == solver::HINGE_TURN::Reload) return "reload";
+    constexpr const char* kTurns[] = {"", "unload", "reload", "slip", "contact"}; // of HINGE_TURN
+    if (event.turn != solver::HINGE_TURN::Point) return kTurns[static_cast<int>(event.turn)];
     const std::string& letters = event.positive ? place.letters.pos : place.letters.neg;
     const auto at = static_cast<std::size_t>(event.point - 1);
     return at < letters.size() ? std::string(1, letters[at]) : std::string();

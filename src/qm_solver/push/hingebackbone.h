@@ -29,6 +29,8 @@ public:
     static bool IsFlowing(const T_HINGE_SIDE& side, double spring);
 
     ON On() const { return m_on; }
+    /// It moves a part of its way without force.
+    bool HasGap() const { return m_gap > 0.0 || m_slips; }
     double Flowed() const { return m_flowed; }
     /// Number of vertices of the law that have been passed, and how many it has.
     int Vertex() const { return static_cast<int>(m_vertex - std::min(m_vertex, m_start)); }
@@ -68,7 +70,6 @@ private:
     struct T_POINT {
         double flowed = 0.0, force = 0.0;
     };
-    bool HasGap() const { return m_gap > 0.0 || m_slips; }
     bool IsReversible() const { return HasGap() || Way() != UNLOADING::Elastic; }
     UNLOADING Way() const
     {

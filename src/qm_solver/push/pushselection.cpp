@@ -250,6 +250,12 @@ void CPushPath::NoteTurns(bool isEnd)
                 return Backbone(mate.flow).On() == ON::Virgin;
             }))
             continue;
+        const bool wasBack = was.on == ON::Back, isBack = now.On() == ON::Back;
+        if (now.HasGap() && wasBack != isBack) {
+            if (wasBack || now.Flowed() > 0.0) // it begins with its gap open
+                note(wasBack ? HINGE_TURN::Contact : HINGE_TURN::Slip, now.Vertex());
+            continue;
+        }
         const bool wasOn = was.on == ON::Virgin, isOn = now.On() == ON::Virgin;
         if (wasOn && !isOn && now.On() != ON::Drop) note(HINGE_TURN::Unload, now.Vertex());
         if (!wasOn && isOn && was.on != ON::Drop) note(HINGE_TURN::Reload, now.Vertex());

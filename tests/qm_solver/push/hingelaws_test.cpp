@@ -105,6 +105,38 @@ TEST(PushLaws, FollowsEveryLawForwardsAndBack)
         ExpectForces(c);
 }
 
+/// The path has its corners where a gap closes and where a slip begins and ends.
+TEST(PushLaws, TellsWhereAGapClosesAndASlipBegins)
+{
+    using TURN = HINGE_TURN;
+    T_HINGE_SIDE gap = Side({{0, 100}}), slip = gap;
+    gap.gap = 0.02;
+    slip.slips = true;
+    struct T_CASE {
+        T_PUSH_MODEL model;
+        std::vector<double> places, corners;
+        std::vector<TURN> turns;
+    };
+    const T_CASE cases[] = {
+        {Bar(gap, gap), {0.3}, {0.02, 0.12}, {TURN::Contact, TURN::Point}},
+        {Bar(slip, slip),
+         {0.3, -0.2},
+         {0.1, 0.3, 0.2, 0.0, -0.1},
+         {TURN::Point, TURN::Unload, TURN::Slip, TURN::Contact, TURN::Point}},
+    };
+    for (const T_CASE& c : cases) {
+        std::vector<T_PUSH_STAGE> stages;
+        for (const double u : c.places)
+            stages.push_back(PushTo(u));
+        const T_PUSHED run = Pushed(c.model, stages);
+        ASSERT_EQ(run.events.size(), c.corners.size());
+        for (std::size_t k = 0; k < c.corners.size(); ++k) {
+            EXPECT_NEAR(run.events[k].displacement, c.corners[k], 1e-9);
+            EXPECT_EQ(run.events[k].hinges[0].turn, c.turns[k]) << k;
+        }
+    }
+}
+
 TEST(PushLaws, BendsAboutBothAxesWithinOnePolygon)
 {
     // Faces across the axes reach 3 degrees to both sides; four chords of 21 degrees lie between
