@@ -5,7 +5,7 @@
 #include "push/pushfirst.h"
 #include "qm_base/say.h"
 #include "qm_rps/push/pushatpointtext.h"
-#include "qm_rps/pushended.h"
+#include "qm_rps/push/pushended.h"
 #include "qm_rps/pushover/evaluation/pushovercomparison.h"
 #include "qm_rps/pushover/report/pushoverreport.h"
 #include "qm_rps/pushovercalculators.h"
@@ -99,7 +99,7 @@ EXIT_CODE EvaluateAll(CDBDoc& doc, const T_EVALUATE_OPTIONS& options,
         if (const std::string fault = ReadFault(doc, eval.push); !fault.empty())
             return Complain(EXIT_CODE::BadInput, fault);
         extras = AddExtras(driver, options, points) && extras;
-        AddPushRemark(doc, out.emplace_back(driver.Result()));
+        out.push_back(driver.Result());
     }
     progress(total, total);
     if (!out.empty()) return EXIT_CODE::Done;
@@ -230,8 +230,6 @@ EXIT_CODE RunCompare(const T_COMPARE_OPTIONS& o)
         return Complain(EXIT_CODE::Usage, o.file + ": " + refusal.text);
     if (const std::string fault = ReadFault(doc, o.push); !fault.empty())
         return Complain(EXIT_CODE::BadInput, fault);
-    for (T_PUSH_EVALUATION& result : comparison.results)
-        AddPushRemark(doc, result);
     EXIT_CODE code = EXIT_CODE::Done;
     if (!o.json.empty()) code = WriteOutput(o.json, ResultJson(comparison.results));
 #ifdef QM_UI

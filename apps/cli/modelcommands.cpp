@@ -6,8 +6,8 @@
 #include "qm_base/textformat.h"
 #include "qm_db/casefile.h"
 #include "qm_db/modelstore.h"
+#include "qm_rps/push/pushended.h"
 #include "qm_rps/push/pushresultlist.h"
-#include "qm_rps/pushended.h"
 
 #include <cstdio>
 

@@ -90,7 +90,7 @@ int AddEvaluations(CDBDoc& doc, SSReportInfoRW& out, std::string& error)
             return 0;
         }
         driver.Evaluate();
-        AddPushRemark(doc, out.evaluations.emplace_back(driver.Result()));
+        out.evaluations.push_back(driver.Result());
     }
     return 1;
 }

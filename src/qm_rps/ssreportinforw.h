@@ -3,7 +3,8 @@
 #pragma once
 
 #include "qm_db/dbdoc.h"
-#include "qm_rps/pushended.h"
+#include "qm_rps/push/pushended.h"
+#include "qm_rps/pushover/pushevaluation.h"
 
 /// A storey, bottom to top.
 struct T_REPORT_STOREY {

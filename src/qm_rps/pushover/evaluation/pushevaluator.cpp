@@ -4,6 +4,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_db/filectrl.h"
 #include "qm_db/recordfacts.h"
+#include "qm_rps/push/pushended.h"
 #include "qm_rps/pushover/evaluation/pushremarks.h"
 #include "qm_rps/pushover/refusal.h"
 
@@ -144,6 +145,8 @@ void CPushEvaluator::WarnAboutCurve()
 {
     if (std::string why; m_doc.Post().IsStale(m_pushover, why))
         m_result.messages.push_back({kResultsAreOld, why});
+    if (auto remark = PushRemark(m_doc, m_eval.push))
+        m_result.messages.push_back(std::move(*remark));
     if (m_curve.StoreyWithoutMass()) Say("IDS_RPS_ERROR_DIAPHRAGM_MASS");
     if (const int step = m_curve.FirstDecreasingStep())
         Say("IDS_QM_WARN_DECREASING_DISPLACEMENT", {m_eval.push, std::to_string(step)});

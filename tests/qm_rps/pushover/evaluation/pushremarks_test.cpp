@@ -208,3 +208,18 @@ TEST(PushRemarks, StepsOlderThanTheModelAreNamed)
     s.content.model.nodes.begin()->second.xyz[0] += 1.0;
     EXPECT_NE(std::string::npos, Remarks(s).find("PUSH_OLD")) << Remarks(s);
 }
+
+TEST(PushRemarks, APushThatCameToNoEndOfItsOwnIsNamed)
+{
+    T_SET_UP s = Sample(METHOD::Atc40, kAtc);
+    T_RUN_DATA run;
+    run.head.control[0] = 1.0;
+    run.head.print = PrintOfPush(s.content.model, 1);
+    for (const auto& [outcome, says] : {std::pair{solver::PUSH_OUTCOME::Reached, false},
+                                        {solver::PUSH_OUTCOME::DriftStop, false},
+                                        {solver::PUSH_OUTCOME::NoPath, true}}) {
+        run.head.end.outcome = outcome;
+        s.content.results = {{1, MakePushRun(run)}};
+        EXPECT_EQ(says, Remarks(s).find("PUSH_CUT") != std::string::npos) << Remarks(s);
+    }
+}

@@ -1,8 +1,11 @@
 // How the pushes of a document have ended, for those who read their results later.
 #pragma once
 
+#include "qm_base/mdialog.h"
+#include "qm_db/dbdoc.h"
 #include "qm_rps/push/pushend.h"
-#include "qm_rps/pushover/pushevaluation.h"
+
+#include <optional>
 
 /// Where and how a result of our own has ended.
 struct T_PUSH_ENDED {
@@ -19,5 +22,3 @@ std::optional<T_PUSH_ENDED> PushEndedOf(CDBDoc& doc, int key, int turn = 0);
 /// That a push (its name) came neither to its target nor to a stop that was asked for, so that its
 /// curve is a part of the one that was wanted; empty where it did, and for imported steps.
 std::optional<zql::frx::T_MESSAGE> PushRemark(CDBDoc& doc, const std::string& push);
-/// The same among the messages of an evaluation.
-void AddPushRemark(CDBDoc& doc, T_PUSH_EVALUATION& result);

@@ -1,4 +1,4 @@
-#include "qm_rps/pushended.h"
+#include "qm_rps/push/pushended.h"
 
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
@@ -39,10 +39,4 @@ std::optional<zql::frx::T_MESSAGE> PushRemark(CDBDoc& doc, const std::string& pu
                                               : "IDS_QM_PUSH_CUT";
     const std::string where = FormatText("%.6g", ended->displacement) + " " + ended->unit;
     return zql::frx::T_MESSAGE{text, Say(text, push, where, PushOutcomeText(ended->outcome))};
-}
-
-void AddPushRemark(CDBDoc& doc, T_PUSH_EVALUATION& result)
-{
-    if (auto remark = PushRemark(doc, result.eval.push))
-        result.messages.push_back(std::move(*remark));
 }
