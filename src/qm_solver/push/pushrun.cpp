@@ -220,11 +220,14 @@ CPushRun::T_FAULT CPushRun::Store(const T_PUSH_STAGE& stage, int number, bool ad
                                   T_PUSH_END& end)
 {
     if (number < 0) return {};
+    const double displacement = stage.control == PUSH_CONTROL::LoadFactor
+                                    ? m_path->Watched(m_nodeWatch[0])
+                                    : Present(stage);
+    if (IsStored(displacement)) return {};
     T_PUSH_STEP& step = m_steps.emplace_back();
     step.stage = static_cast<std::size_t>(number);
     step.loadFactor = m_stored = m_path->Factor();
-    step.displacement = stage.control == PUSH_CONTROL::LoadFactor ? m_path->Watched(m_nodeWatch[0])
-                                                                  : Present(stage);
+    m_storedAt = step.displacement = displacement;
     step.additional = additional;
     step.hinges = m_path->HingeStates();
     m_states.push_back(m_path->State());

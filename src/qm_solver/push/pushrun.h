@@ -46,6 +46,7 @@ private:
     double ReactionRate(const T_PUSH_STAGE& stage) const;
     T_VEC6 Base() const;
     void NoteEvent(const T_PUSH_STAGE& stage, int number);
+    bool IsStored(double displacement) const;
     T_FAULT Store(const T_PUSH_STAGE& stage, int number, bool additional, T_PUSH_END& end);
     T_FAULT Update(const T_PUSH_STAGE& stage, std::optional<double> control);
     T_FAULT Approach(const T_PUSH_STAGE& stage, double by);
@@ -68,9 +69,10 @@ private:
     std::vector<T_TARGET> m_targets;
     std::size_t m_target = 0;
     double m_start = 0.0, m_sign = 1.0;
-    double m_stored = 0.0; // load factor of the last stored step
-    double m_far = 0.0;    // furthest control displacement of the stage
-    double m_origin = 0.0; // control displacement before the first stage
+    double m_stored = 0.0;            // load factor of the last stored step
+    std::optional<double> m_storedAt; // its displacement; empty: none in this stage
+    double m_far = 0.0;               // furthest control displacement of the stage
+    double m_origin = 0.0;            // control displacement before the first stage
     bool m_isFirst = true;
     T_PEAK m_peak;
     std::vector<T_PUSH_EVENT> m_events;                // of the initial loads, until they are final

@@ -46,6 +46,7 @@ void CPushRun::MakeTargets(const T_PUSH_STAGE& stage)
     m_peak = {};
     m_far = m_start;
     m_stored = 0.0;
+    m_storedAt.reset();
     m_targets.clear();
     m_target = 0;
     const double way = stage.target - m_start;
@@ -73,6 +74,16 @@ void CPushRun::MakeTargets(const T_PUSH_STAGE& stage)
             apart.push_back(t);
     }
     m_targets = std::move(apart);
+}
+
+/// The path stands where the last step was stored: a stop there is that step.
+bool CPushRun::IsStored(double displacement) const
+{
+    constexpr double kSame = 1e-12; // of the value: rounding of the way to it
+    const auto same = [](double a, double b) {
+        return std::fabs(a - b) <= kSame * std::max(std::fabs(a), std::fabs(b));
+    };
+    return m_storedAt && same(*m_storedAt, displacement) && same(m_stored, m_path->Factor());
 }
 
 /// Along the rates, to the next stored step; infinite where the path leads away from it.

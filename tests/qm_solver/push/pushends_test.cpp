@@ -155,6 +155,30 @@ TEST(PushEnds, AdditionalStepsAreExactAndMarked)
     EXPECT_NEAR(run.steps[0].loadFactor, 50.0, 1e-9);
 }
 
+TEST(PushEnds, AStopOnAStepIsThatStep)
+{
+    const struct {
+        PUSH_OUTCOME outcome;
+        double step; // where the stop is due, by hand as above
+    } kRows[] = {{PUSH_OUTCOME::DriftStop, 1.0},
+                 {PUSH_OUTCOME::MarkStop, 4.0 / 3.0 + 0.04},
+                 {PUSH_OUTCOME::StiffnessStop, 4.0 / 3.0}};
+    for (const auto& row : kRows) {
+        T_PUSH_MODEL model = YieldingColumn();
+        model.drifts.push_back({1, T_PUSH_DRIFT::kGround, 2.0});
+        model.hinges[0].laws[0].negative.marks = model.hinges[0].laws[0].positive.marks = {0.02};
+        T_PUSH_STAGE stage = PushTo(3.0);
+        stage.steps = {0.1, row.step / 3.0, 1.0};
+        if (row.outcome == PUSH_OUTCOME::DriftStop) stage.stops.drift = 0.5;
+        if (row.outcome == PUSH_OUTCOME::MarkStop) stage.stops.mark = 0;
+        if (row.outcome == PUSH_OUTCOME::StiffnessStop) stage.stops.stiffnessRatio = 0.1;
+        const T_PUSHED run = Pushed(model, {stage});
+        EXPECT_EQ(row.outcome, run.end.outcome);
+        ASSERT_EQ(2u, run.steps.size()) << row.step;
+        EXPECT_NEAR(row.step, run.steps[1].displacement, 1e-12);
+    }
+}
+
 /// Work of the loads from step to step, energy in the members, and what the hinges have taken.
 TEST(PushEnds, WorkIsElasticEnergyAndDissipation)
 {
