@@ -9,37 +9,38 @@
 
 namespace {
 
-/// Curves are drawn to the right whichever way the structure is pushed.
-double SignOf(const T_POLC_D& record)
-{
-    const bool back =
-        record.control && record.control->masterNodeControl && record.control->masterMaxDispl < 0.0;
-    return back ? -1.0 : 1.0;
-}
+/// What leads from the displacements of an evaluation (magnitudes, counted from the first step) to
+/// those that a step is told by: the whole one of the control node, with its sign; m.
+struct T_WAY {
+    double start = 0.0; // before the first step
+    double sign = 1.0;  // where the control node has gone, however it is controlled
 
-/// Displacement of the control node before the first step of a stored run (m): an evaluation counts
-/// from there, a step is told by the whole.
-double StartOf(CDBDoc& doc, int key)
+    double At(double magnitude) const { return start + sign * std::fabs(magnitude); }
+};
+
+T_WAY WayOf(IPushRun& run, int controlNode)
 {
-    IPushRun* const run = doc.Post().RunOf(key);
+    T_WAY way;
     std::vector<T_DOF6> start;
-    if (!run || !run->ReadStart(start)) return 0.0;
-    const std::vector<int> nodes = run->NodeIds();
-    const auto at =
-        std::ranges::lower_bound(nodes, doc.Data().Model().pushovers.at(key).controlNode);
-    if (at == nodes.end()) return 0.0;
-    double along = 0.0;
+    std::vector<double> moved;
+    const std::vector<int> nodes = run.NodeIds();
+    const auto at = std::ranges::lower_bound(nodes, controlNode);
+    if (!run.ReadStart(start) || !run.ReadDisplacements(controlNode, moved) || moved.empty())
+        return way;
     for (std::size_t d = 0; d < 6; ++d)
-        along += run->Head().control[d] * start[static_cast<std::size_t>(at - nodes.begin())][d];
-    return along;
+        way.start += run.Head().control[d] * start[static_cast<std::size_t>(at - nodes.begin())][d];
+    const double furthest =
+        *std::ranges::max_element(moved, {}, [](double u) { return std::fabs(u); });
+    way.sign = furthest < 0.0 ? -1.0 : 1.0;
+    return way;
 }
 
-std::vector<T_PUSH_POINT> PointsOf(const T_PUSH_EVALUATION& e, double sign, double start)
+std::vector<T_PUSH_POINT> PointsOf(const T_PUSH_EVALUATION& e, const T_WAY& way)
 {
     std::vector<T_PUSH_POINT> out;
     const auto add = [&](PUSH_POINT kind, const std::string& state, std::optional<double> d) {
         if (!d || *d == 0.0 || !std::isfinite(*d)) return;
-        out.push_back({kind, state, start + sign * std::fabs(ToSi(*d, e.units, kDimLength))});
+        out.push_back({kind, state, way.At(ToSi(*d, e.units, kDimLength))});
     };
     if (e.point) add(PUSH_POINT::Performance, {}, e.point->D);
     for (const T_LIMIT_ROW& row : e.limitStates) {
@@ -56,6 +57,14 @@ std::string WhyNotPushed(const T_POLC_D& record)
     if (record.direction >= kFirstRotation) return Say("IDS_QM_PUSH_AT_TURN");
     const bool many = record.control && record.control->generateStaticAngle;
     return many ? Say("IDS_QM_PUSH_AT_DIRECTIONS") : std::string();
+}
+
+/// A step of the run without those of evaluations is there: it stays one that these read.
+bool IsStep(const T_PUSH_RUN& run, double displacement)
+{
+    return std::ranges::any_of(run.displacement, [&](double d) {
+        return std::fabs(d - displacement) <= kSameDisplacement * std::fabs(displacement);
+    });
 }
 
 /// Displacements that the engine can be asked for.
@@ -102,11 +111,16 @@ std::vector<T_HINGES_AT> HingesOfEvaluations(CDBDoc& doc,
         if (!doc.Attr().FindPolc(e.eval.push, key) || !doc.Post().RunOf(key) ||
             doc.Post().IsStale(key, old))
             continue;
+        const int controlNode = doc.Data().Model().pushovers.at(key).controlNode;
         out[i].evaluation = e.eval.name.empty() ? MethodName(e.eval.method) : e.eval.name;
         out[i].push = e.eval.push;
         out[i].units = e.units;
-        std::vector<T_PUSH_POINT> points =
-            PointsOf(e, SignOf(doc.Data().Model().pushovers.at(key)), StartOf(doc, key));
+        if (e.loadCase.controlNode != controlNode) {
+            out[i].note = Say("IDS_QM_PUSH_AT_OTHER_NODE", std::to_string(e.loadCase.controlNode),
+                              std::to_string(controlNode));
+            continue;
+        }
+        std::vector<T_PUSH_POINT> points = PointsOf(e, WayOf(*doc.Post().RunOf(key), controlNode));
         if (!points.empty()) wanted[key][&out[i]] = std::move(points);
     }
     CPushRun push(doc);
@@ -121,7 +135,9 @@ std::vector<double> StepsOfEvaluations(CDBDoc& doc, std::span<const T_PUSH_RUN> 
     const T_POLC_D record = doc.Data().Model().pushovers.at(runs.front().key);
     if (!record.additionalEvaluations) return {};
     std::vector<double> out;
-    const double sign = SignOf(record);
+    IPushRun* const stored = doc.Post().RunOf(runs.front().key);
+    if (!stored) return out;
+    const T_WAY way = WayOf(*stored, record.controlNode);
     CPushEvaluator evaluator(doc, RunPerfPtProcedure);
     evaluator.SetStoreSteps(false);
     evaluator.SetFindAllPoints(false);
@@ -129,14 +145,14 @@ std::vector<double> StepsOfEvaluations(CDBDoc& doc, std::span<const T_PUSH_RUN> 
         T_EVAL_D eval;
         T_FINDING refusal;
         if (entry.second.push != record.name || !doc.Attr().GetEval(entry.first, eval) ||
-            !evaluator.SetEvaluation(eval, refusal) || evaluator.Evaluate() == 0)
+            !evaluator.SetEvaluation(eval, refusal) || evaluator.Evaluate() == 0 ||
+            evaluator.Result().loadCase.controlNode != record.controlNode)
             continue;
         const T_PUSH_EVALUATION& result = evaluator.Result();
         const auto add = [&](double d) {
             // an evaluation counts from the start of the push, a step is told by the whole
-            const double si = sign * std::fabs(ToSi(d, doc.Unit().Units(), kDimLength)) +
-                              runs.front().startDisplacement;
-            if (si != 0.0 && IsOnTheWay(record, si)) out.push_back(si);
+            const double si = way.At(ToSi(d, doc.Unit().Units(), kDimLength));
+            if (si != 0.0 && IsOnTheWay(record, si) && !IsStep(runs.front(), si)) out.push_back(si);
         };
         if (result.point) add(result.point->D);
         for (const T_LIMIT_ROW& row : result.limitStates)

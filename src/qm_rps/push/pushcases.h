@@ -18,6 +18,8 @@ struct T_PUSH_CASE {
     /// Those of the cases that it starts from, the first one first; its own is the last.
     std::vector<solver::T_PUSH_STAGE> stages;
 };
+/// Displacements of one push that are so near are the same; of the value.
+inline constexpr double kSameDisplacement = 1e-9;
 
 /// What several load cases of a model can be run on: loads before the push, and P-Delta.
 struct T_PUSH_BASIS {

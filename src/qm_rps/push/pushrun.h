@@ -44,7 +44,6 @@ struct T_PUSH_RUN {
     PUSH_STATUS status = PUSH_STATUS::Failed;
     std::string outcome, advice;
     bool cancelled = false;
-    double startDisplacement = 0.0; // of the control node, before the first step
     std::vector<double> loadFactor, displacement, baseReaction, residual;
     std::vector<int> additional; // numbers of the steps that were asked for
     std::vector<T_PUSH_EVENT_ROW> events;
