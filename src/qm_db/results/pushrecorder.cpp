@@ -57,9 +57,12 @@ void CPushRecorder::Add(const solver::T_PUSH_EVENT& event)
     m_data.events.push_back(std::move(out));
 }
 
-void CPushRecorder::End(const solver::T_PUSH_END& end)
+void CPushRecorder::End(const solver::T_PUSH_END& end, int storey)
 {
-    const int element = end.hinge < 0 ? 0 : m_element[static_cast<std::size_t>(end.hinge)];
-    m_data.head.end = {end.outcome, static_cast<int>(end.stage), end.loadFactor, end.displacement,
-                       element};
+    m_data.head.end = {
+        end.outcome, static_cast<int>(end.stage), end.loadFactor, end.displacement, 0, 0, storey};
+    if (end.hinge < 0) return;
+    const auto hinge = static_cast<std::size_t>(end.hinge);
+    m_data.head.end.element = m_element[hinge];
+    m_data.head.end.hinge = m_first[hinge] + 1;
 }

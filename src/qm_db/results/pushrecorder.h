@@ -19,7 +19,8 @@ public:
     void Start(const solver::T_PUSH_STEP& step);
     void Add(const solver::T_PUSH_STEP& step);
     void Add(const solver::T_PUSH_EVENT& event);
-    void End(const solver::T_PUSH_END& end);
+    /// storey: the one whose drift ended it, from 1; 0: none.
+    void End(const solver::T_PUSH_END& end, int storey = 0);
 
     const T_RUN_DATA& Data() const { return m_data; }
     T_RUN_DATA Take() { return std::move(m_data); }

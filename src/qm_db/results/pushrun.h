@@ -68,6 +68,8 @@ struct T_RUN_END {
     int stage = 0;
     double loadFactor = 0.0, displacement = 0.0;
     int element = 0; // of the hinge that ended it; 0: none
+    int hinge = 0;   // its first component, from 1 in the list of hinges; 0: none, or not known
+    int storey = 0;  // whose drift ended it, from 1, bottom to top; 0: none, or not known
     bool operator==(const T_RUN_END&) const = default;
 };
 

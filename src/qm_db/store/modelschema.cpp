@@ -69,7 +69,8 @@ constexpr const char* kVersion5[] = {
     "end_load_factor REAL NOT NULL, end_displacement REAL NOT NULL, "
     "end_element INTEGER NOT NULL, structure_print INTEGER NOT NULL, "
     "hinge_print INTEGER NOT NULL, load_print INTEGER NOT NULL, setup_print INTEGER NOT NULL, "
-    "negative_zeros INTEGER NOT NULL) STRICT"};
+    "negative_zeros INTEGER NOT NULL, end_hinge INTEGER NOT NULL, end_storey INTEGER NOT NULL) "
+    "STRICT"};
 
 // Scalars are typed columns, quantities in SI. Bit i of negative_zeros says that the i-th column
 // of the row is -0.0: a REAL column stores a whole number as an integer, which has no such value.
@@ -152,6 +153,8 @@ constexpr T_ADDED_COLUMN kAddedColumns[] = {
     {2, "CREATE TABLE pushovers(", "body TEXT"},
     {3, "CREATE TABLE model(", "plane INTEGER"},
     {4, "CREATE TABLE model(", "body TEXT"},
+    {6, "CREATE TABLE push_results(", "end_hinge INTEGER NOT NULL"},
+    {6, "CREATE TABLE push_results(", "end_storey INTEGER NOT NULL"},
 };
 
 constexpr T_MEMBER_PLACE kMemberPlaces[] = {
@@ -237,6 +240,13 @@ void MigrateFrom4(const CSqliteDb& db)
         db.Exec(sql);
 }
 
+/// Version 5 did not know which end of an element, or which storey, had ended a push.
+void MigrateFrom5(const CSqliteDb& db)
+{
+    db.Exec("ALTER TABLE push_results ADD COLUMN end_hinge INTEGER NOT NULL DEFAULT 0;"
+            "ALTER TABLE push_results ADD COLUMN end_storey INTEGER NOT NULL DEFAULT 0");
+}
+
 /// Tables of a version, in the order in which it makes them.
 std::vector<std::string> TablesOf(int version)
 {
@@ -265,9 +275,12 @@ std::span<const T_MEMBER_PLACE> MemberPlaces()
 
 const T_SCHEMA& CurrentSchema()
 {
-    static constexpr T_MIGRATION kMigrations[] = {
-        {1, MigrateFrom1}, {2, MigrateFrom2}, {3, MigrateFrom3}, {4, MigrateFrom4}};
-    static constexpr T_SCHEMA kSchema{5, kMigrations};
+    static constexpr T_MIGRATION kMigrations[] = {{1, MigrateFrom1},
+                                                  {2, MigrateFrom2},
+                                                  {3, MigrateFrom3},
+                                                  {4, MigrateFrom4},
+                                                  {5, MigrateFrom5}};
+    static constexpr T_SCHEMA kSchema{6, kMigrations};
     return kSchema;
 }
 

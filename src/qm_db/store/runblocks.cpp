@@ -54,6 +54,8 @@ constexpr T_WHOLE kWhole[] = {
     {"turns", [](T_RUN_ROW& r) -> int& { return r.turns; }},
     {"end_stage", [](T_RUN_ROW& r) -> int& { return r.head.end.stage; }},
     {"end_element", [](T_RUN_ROW& r) -> int& { return r.head.end.element; }},
+    {"end_hinge", [](T_RUN_ROW& r) -> int& { return r.head.end.hinge; }},
+    {"end_storey", [](T_RUN_ROW& r) -> int& { return r.head.end.storey; }},
 };
 struct T_REAL {
     const char* column;

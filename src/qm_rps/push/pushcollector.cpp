@@ -1,6 +1,7 @@
 #include "qm_rps/push/pushcollector.h"
 
 #include "qm_base/say.h"
+#include "qm_db/recordfacts.h"
 #include "qm_rps/push/loadalgebra.h"
 
 namespace {
@@ -40,6 +41,14 @@ CPushCollector::CPushCollector(const T_MODEL& model, const CAnalysisModel& frame
         const solver::T_PUSH_HINGE& hinge = hinges.hinges[hinges.laws[i].hinge];
         m_run.hinges.push_back(
             {hinges.laws[i], hinge.laws[hinges.laws[i].law], hinge.biaxial, {}, {}, {}});
+    }
+    for (const solver::T_PUSH_DRIFT& drift : DriftsOf(model, frame, m_storeys)) {
+        const auto has = [&](const T_PUSH_STOREY& storey) {
+            return std::ranges::find(storey.nodes, drift.node) != storey.nodes.end() &&
+                   storey.height == drift.height;
+        };
+        const auto at = std::ranges::find_if(m_storeys, has);
+        m_driftStorey.push_back(static_cast<int>(at - m_storeys.begin()) + 1);
     }
     for (const T_PUSH_STOREY& storey : m_storeys)
         m_run.storeys.push_back({storey.name, storey.elevation, storey.height, {}, {}, {}});
@@ -119,21 +128,38 @@ void CPushCollector::Take(const solver::T_PUSH_EVENT& event)
 std::string CPushCollector::HingeWords(long hinge) const
 {
     if (hinge < 0 || static_cast<std::size_t>(hinge) >= m_lawAt.size()) return {};
-    const T_PUSH_LAW_PLACE& place = m_hinges.laws[m_lawAt[static_cast<std::size_t>(hinge)].front()];
-    return Say("IDS_QM_PUSH_HINGE_AT", std::to_string(place.element), place.end);
+    const std::vector<std::size_t>& laws = m_lawAt[static_cast<std::size_t>(hinge)];
+    std::string components;
+    for (const std::size_t law : laws)
+        components +=
+            (components.empty() ? "" : "-") +
+            std::string(kComponentNames[static_cast<std::size_t>(m_hinges.laws[law].component)]);
+    const T_PUSH_LAW_PLACE& place = m_hinges.laws[laws.front()];
+    return Say("IDS_QM_PUSH_HINGE_AT", std::to_string(place.element), place.end, components);
 }
 
-T_PUSH_RUN CPushCollector::Finish(const solver::T_PUSH_END& end)
+/// The hinge or the storey that ended it; empty: neither.
+std::string CPushCollector::PlaceWords(const solver::T_PUSH_END& end, int storey) const
 {
+    if (const std::string hinge = HingeWords(end.hinge); !hinge.empty())
+        return Say("IDS_QM_PUSH_ADVICE_HINGE", hinge);
+    if (storey < 1 || storey > std::ssize(m_storeys)) return {};
+    return Say("IDS_QM_PUSH_ADVICE_STOREY", m_storeys[static_cast<std::size_t>(storey - 1)].name);
+}
+
+T_PUSH_RUN CPushCollector::Finish(const solver::T_PUSH_END& end, int storey)
+{
+    if (end.drift >= 0 && end.drift < std::ssize(m_driftStorey))
+        storey = m_driftStorey[static_cast<std::size_t>(end.drift)];
     m_run.cancelled = end.outcome == solver::PUSH_OUTCOME::Cancelled;
     m_run.status = StatusOf(end.outcome);
     m_run.outcome = PushOutcomeName(end.outcome);
-    m_run.advice = PushOutcomeAdvice(end.outcome, end.loadFactor, HingeWords(end.hinge));
+    m_run.advice = PushOutcomeAdvice(end.outcome, end.loadFactor, PlaceWords(end, storey));
     if (end.stage + 1 < m_case.stages.size() && end.outcome != solver::PUSH_OUTCOME::InitialLoads) {
         m_run.status = PUSH_STATUS::Failed;
         m_run.advice = Say("IDS_QM_PUSH_ADVICE_EARLIER") + " " + m_run.advice;
     }
-    m_recorder.End(end);
+    m_recorder.End(end, storey);
     m_run.data = m_recorder.Take();
     return std::move(m_run);
 }

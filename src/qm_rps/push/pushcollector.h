@@ -22,19 +22,22 @@ public:
     bool Take(const solver::T_PUSH_STEP& step);
     void Take(const solver::T_PUSH_EVENT& event);
     const T_PUSH_RUN& SoFar() const { return m_run; }
-    T_PUSH_RUN Finish(const solver::T_PUSH_END& end);
+    /// storey: whose drift ended it, from 1, where the end does not tell (0).
+    T_PUSH_RUN Finish(const solver::T_PUSH_END& end, int storey = 0);
 
 private:
     static T_RUN_HEAD HeadOf(const T_PUSH_CASE& c);
     double Along(const solver::T_VEC6& v) const;
     void TakeStoreys(const solver::T_PUSH_STEP& step);
     std::string HingeWords(long hinge) const;
+    std::string PlaceWords(const solver::T_PUSH_END& end, int storey) const;
 
     const solver::T_FRAME& m_frame;
     const T_PUSH_HINGES& m_hinges;
     const T_PUSH_CASE& m_case;
     std::size_t m_vertical = 2;
     std::vector<T_PUSH_STOREY> m_storeys;
+    std::vector<int> m_driftStorey;                    // of the engine's drifts: the storey, from 1
     std::vector<std::vector<solver::T_VEC3>> m_forces; // by stage and node, at load factor 1
     std::vector<double> m_factors;                     // of the stages, at present
     std::vector<std::vector<std::size_t>> m_lawAt;     // by hinge and law: index of the run's

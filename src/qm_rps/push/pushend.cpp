@@ -66,8 +66,8 @@ std::string PushOutcomeText(solver::PUSH_OUTCOME outcome)
 }
 
 std::string PushOutcomeAdvice(solver::PUSH_OUTCOME outcome, double loadFactor,
-                              const std::string& hinge)
+                              const std::string& place)
 {
     const std::string text = Say(RowOf(outcome).advice, FormatText("%.6g", loadFactor));
-    return hinge.empty() ? text : text + " " + Say("IDS_QM_PUSH_ADVICE_HINGE", hinge);
+    return place.empty() ? text : text + " " + place;
 }

@@ -15,7 +15,7 @@ std::string PushOutcomeName(solver::PUSH_OUTCOME outcome);
 /// Both in the chosen language.
 std::string PushStatusText(PUSH_STATUS status);
 std::string PushOutcomeText(solver::PUSH_OUTCOME outcome);
-/// What it means and what to look at, in the chosen language. loadFactor: of the end; hinge: the
-/// one that ended it, in words, may be empty.
+/// What it means and what to look at, in the chosen language. loadFactor: of the end; place: the
+/// hinge or storey that ended it, a sentence, may be empty.
 std::string PushOutcomeAdvice(solver::PUSH_OUTCOME outcome, double loadFactor,
-                              const std::string& hinge);
+                              const std::string& place);

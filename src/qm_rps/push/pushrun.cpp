@@ -288,8 +288,13 @@ int CPushRun::Read(int key, int turn, T_PUSH_RUN& out, std::string& error)
     for (const T_RUN_EVENT& event : data.events)
         collector.Take(EventOf(event, on->hinges));
     const T_RUN_END& end = data.head.end;
+    const bool knowsHinge = end.hinge > 0 && end.hinge <= std::ssize(on->hinges.laws);
+    const std::size_t law = knowsHinge ? static_cast<std::size_t>(end.hinge - 1) : 0;
+    const long hinge = knowsHinge ? static_cast<long>(on->hinges.laws[law].hinge) : -1;
     out = collector.Finish({end.outcome, static_cast<std::size_t>(end.stage), end.loadFactor,
-                            end.displacement, -1, -1});
+                            end.displacement, hinge, -1},
+                           end.storey);
+    out.data.steps = std::move(data.steps); // with what evaluations have asked for
     if (!before)
         for (T_PUSH_STOREY_SERIES& storey : out.storeys)
             storey.shear.clear();
