@@ -16,6 +16,8 @@
 #include "qm_rps/rpsmanager.h"
 #include "qm_ui/pushover/pushovercurveview.h"
 
+#include <numeric>
+
 namespace {
 
 QString Text(const char* key)
@@ -168,7 +170,9 @@ std::vector<T_WINDOW_EXAMPLE> PushoverWindowExamples()
     };
     const auto steps = [](CDBDoc&) {
         auto model = std::make_unique<CPushOverAdditionalStepDlg>();
-        model->SetStepCount(50);
+        std::vector<int> all(51);
+        std::iota(all.begin(), all.end(), 0);
+        model->SetCurve(all);
         T_FINDING refusal;
         for (const int step : {12, 30})
             (void)model->AddStep(step, refusal);

@@ -9,10 +9,12 @@ int CPushOverAdditionalStepDlg::AddStep(int step, T_FINDING& refusal)
 {
     if (m_steps.size() >= kMaxAdditional)
         return Refuse(refusal, "step", "IDS_RPS_PUSHOVER_Maxnum_reached");
-    if (m_stepCount < 1) return Refuse(refusal, "step", "IDS_QM_NO_STEPS", {std::to_string(step)});
-    if (step < 1 || step > m_stepCount)
+    if (StepCount() < 1) return Refuse(refusal, "step", "IDS_QM_NO_STEPS", {std::to_string(step)});
+    if (step < 1 || step > StepCount())
         return Refuse(refusal, "step", "IDS_QM_NO_SUCH_STEP",
-                      {std::to_string(step), std::to_string(m_stepCount)});
+                      {std::to_string(step), std::to_string(StepCount())});
+    if (std::ranges::find(m_curve, step) == m_curve.end())
+        return Refuse(refusal, "step", "IDS_QM_STEP_EVALUATED", {std::to_string(step)});
     if (std::ranges::find(m_steps, step) != m_steps.end())
         return Refuse(refusal, "step", "IDS_QM_STEP_LISTED", {std::to_string(step)});
     m_steps.push_back(step);

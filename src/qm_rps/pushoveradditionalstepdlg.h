@@ -9,13 +9,14 @@
 
 class CPushOverAdditionalStepDlg : public zql::frx::MDialog {
 public:
-    /// Steps that exist: 1 to stepCount.
-    void SetStepCount(int stepCount) { m_stepCount = stepCount; }
-    int StepCount() const { return m_stepCount; }
+    /// Numbers of the steps of the curve, ascending; 0 is none.
+    void SetCurve(std::vector<int> steps) { m_curve = std::move(steps); }
+    /// The last one.
+    int StepCount() const { return m_curve.empty() ? 0 : m_curve.back(); }
 
     /// 1 added; 0 the list is full (IDS_RPS_PUSHOVER_Maxnum_reached), there are no steps
-    /// (IDS_QM_NO_STEPS), this one does not exist (IDS_QM_NO_SUCH_STEP) or is listed already
-    /// (IDS_QM_STEP_LISTED).
+    /// (IDS_QM_NO_STEPS), this one does not exist (IDS_QM_NO_SUCH_STEP), is not on the curve
+    /// (IDS_QM_STEP_EVALUATED) or is listed already (IDS_QM_STEP_LISTED).
     [[nodiscard]] int AddStep(int step, T_FINDING& refusal);
     void Clear() { m_steps.clear(); }
     /// In the order of adding.
@@ -30,6 +31,5 @@ public:
     void OnRemove();
 
 private:
-    int m_stepCount = 0;
-    std::vector<int> m_steps;
+    std::vector<int> m_curve, m_steps;
 };

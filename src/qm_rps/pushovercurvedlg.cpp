@@ -34,7 +34,7 @@ int CPushOverCurveDlg::CalcAdditionalPerformancePoint(const std::string& spectru
 
 int CPushOverCurveDlg::OnPushoverCurveAddStep(int step)
 {
-    m_additionalSteps.SetStepCount(static_cast<int>(Result().capacity.Sd.size()) - 1);
+    m_additionalSteps.SetCurve(Result().steps);
     if (!m_additionalSteps.AddStep(step, m_refusal)) return ShowRefusal();
     m_evaluator.ListStep(step);
     return 1;

@@ -141,7 +141,7 @@ int CPushOverCurveEdit::OnControl()
 int CPushOverCurveEdit::OnSteps()
 {
     CPushOverAdditionalStepDlg steps;
-    steps.SetStepCount(static_cast<int>(m_shown.Result().capacity.Sd.size()) - 1);
+    steps.SetCurve(m_shown.Result().steps);
     T_FINDING refusal; // steps that the curve has no more are left out
     for (const int step : m_steps)
         (void)steps.AddStep(step, refusal);

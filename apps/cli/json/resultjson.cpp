@@ -202,6 +202,8 @@ void Write(CJsonText& w, const T_PUSH_EVALUATION& e, const T_HINGES_AT* hinges)
     WriteFactors(w, e);
     w.Key("capacity").Object();
     w.Items("Sd", e.capacity.Sd, kJsonNested).Items("Sa", e.capacity.Sa, kJsonNested);
+    if (!e.steps.empty() && e.StepAt(e.steps.size() - 1) + 1 != std::ssize(e.steps))
+        w.Items("step", e.steps, kJsonNested); // else it is the index
     w.End();
     w.Key("performance_point");
     Write(w, e.point);

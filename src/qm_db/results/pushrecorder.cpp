@@ -33,7 +33,7 @@ void CPushRecorder::Start(const solver::T_PUSH_STEP& step)
     m_data.head.startReaction = BaseReaction(step.base);
 }
 
-void CPushRecorder::Add(const solver::T_PUSH_STEP& step)
+void CPushRecorder::Add(const solver::T_PUSH_STEP& step, bool evaluated)
 {
     std::vector<T_RUN_STATE> states;
     for (std::size_t i = 0; i < m_hinge.size(); ++i) {
@@ -41,7 +41,8 @@ void CPushRecorder::Add(const solver::T_PUSH_STEP& step)
         states.push_back({s.deformation, s.force, step.axial[m_hinge[i]], s.place});
     }
     m_data.steps.push_back({static_cast<int>(step.stage), step.loadFactor, step.displacement,
-                            BaseReaction(step.base), step.base, step.residual, step.additional});
+                            BaseReaction(step.base), step.base, step.residual, step.additional,
+                            evaluated});
     m_data.displacement.push_back(step.nodes);
     m_data.states.push_back(std::move(states));
 }

@@ -17,7 +17,8 @@ public:
 
     /// The state before the first step.
     void Start(const solver::T_PUSH_STEP& step);
-    void Add(const solver::T_PUSH_STEP& step);
+    /// evaluated: see T_RUN_STEP.
+    void Add(const solver::T_PUSH_STEP& step, bool evaluated = false);
     void Add(const solver::T_PUSH_EVENT& event);
     /// storey: the one whose drift ended it, from 1; 0: none.
     void End(const solver::T_PUSH_END& end, int storey = 0);

@@ -29,6 +29,7 @@ struct T_RUN_STEP {
     T_DOF6 base{};             // sum of the reactions, global, moments about the origin
     double residual = 0.0;     // out of balance over the largest force
     bool additional = false;   // asked for by the user
+    bool evaluated = false;    // additional for what evaluations find: they do not read it
     bool operator==(const T_RUN_STEP&) const = default;
 };
 

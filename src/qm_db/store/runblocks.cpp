@@ -95,9 +95,10 @@ T_HINGE_NUMBERS NumbersOf(const T_RUN_HINGE& h)
 }
 T_STEP_NUMBERS NumbersOf(const T_RUN_STEP& s)
 {
-    return {1.0 * s.stage, s.loadFactor, s.displacement, s.baseReaction,
-            s.base[0],     s.base[1],    s.base[2],      s.base[3],
-            s.base[4],     s.base[5],    s.residual,     s.additional ? 1.0 : 0.0};
+    return {1.0 * s.stage,  s.loadFactor, s.displacement,
+            s.baseReaction, s.base[0],    s.base[1],
+            s.base[2],      s.base[3],    s.base[4],
+            s.base[5],      s.residual,   s.evaluated ? 2.0 : s.additional ? 1.0 : 0.0};
 }
 T_EVENT_NUMBERS NumbersOf(const T_RUN_EVENT& e)
 {

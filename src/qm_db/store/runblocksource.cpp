@@ -89,8 +89,9 @@ int CBlockPushRun::ReadSteps(std::vector<T_RUN_STEP>& out)
         constexpr std::size_t kWidth = std::tuple_size_v<T_STEP_NUMBERS>;
         for (std::size_t at = 0; at < all.size(); at += kWidth) {
             const auto n = std::span(all).subspan(at, kWidth);
+            const int additional = WholeOf(kPart, n[11], 0, 2);
             out.push_back({WholeOf(kPart, n[0], 0, kLargest), n[1], n[2], n[3], VectorAt(n, 4),
-                           n[10], WholeOf(kPart, n[11], 0, 1) == 1});
+                           n[10], additional > 0, additional == 2});
         }
     });
 }

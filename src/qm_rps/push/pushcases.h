@@ -17,6 +17,7 @@ struct T_PUSH_CASE {
     std::size_t controlNode = 0; // of the engine
     /// Those of the cases that it starts from, the first one first; its own is the last.
     std::vector<solver::T_PUSH_STAGE> stages;
+    std::vector<double> evaluated{}; // of its additional displacements: asked for by evaluations
 };
 /// Displacements of one push that are so near are the same; of the value.
 inline constexpr double kSameDisplacement = 1e-9;

@@ -4,6 +4,8 @@
 #include "qm_db/recordfacts.h"
 #include "qm_rps/push/loadalgebra.h"
 
+#include <cmath>
+
 namespace {
 
 /// What the recorder reads of the engine's model.
@@ -90,8 +92,16 @@ bool CPushCollector::Take(const solver::T_PUSH_STEP& step)
         series.state.push_back(StateOf(series.place, series.law, state));
     }
     TakeStoreys(step);
-    m_recorder.Add(step);
+    m_recorder.Add(step, step.additional && IsEvaluated(m_run.displacement.back()));
     return true;
+}
+
+/// The place of a step that evaluations have asked for.
+bool CPushCollector::IsEvaluated(double displacement) const
+{
+    return std::ranges::any_of(m_case.evaluated, [&](double d) {
+        return std::fabs(d - displacement) <= kSameDisplacement * std::fabs(d);
+    });
 }
 
 void CPushCollector::TakeStoreys(const solver::T_PUSH_STEP& step)

@@ -28,6 +28,7 @@ public:
 private:
     static T_RUN_HEAD HeadOf(const T_PUSH_CASE& c);
     double Along(const solver::T_VEC6& v) const;
+    bool IsEvaluated(double displacement) const;
     void TakeStoreys(const solver::T_PUSH_STEP& step);
     std::string HingeWords(long hinge) const;
     std::string PlaceWords(const solver::T_PUSH_END& end, int storey) const;

@@ -66,7 +66,7 @@ struct T_ADDITIONAL_POINT {
 struct T_MONITORED_NODE {
     int node = 0;
     bool hasResults = false;
-    std::vector<double> x; // index = step
+    std::vector<double> x; // by index of the steps
 };
 
 /// What a picture of the demand spectrum alone stands over; the show modes of the spectrum object.
@@ -75,7 +75,7 @@ enum class SPECTRUM_SHOW { Displacement = 0, Period = 1 };
 /// A curve in the coordinates of a plot type.
 struct T_PLOTTED_CURVE {
     PLOT_TYPE type = PLOT_TYPE::Atc40;
-    std::vector<double> x, y;                  // index = step
+    std::vector<double> x, y;                  // by index of the steps
     double largestX = 0.0, largestY = 0.0;     // of its nodes and forces
     std::vector<T_MONITORED_NODE> monitored{}; // further nodes, as the evaluation names them
 };
@@ -95,7 +95,8 @@ struct T_PUSH_EVALUATION {
     T_PUSH_FACTORS factors;
     double mStar = 0.0; // mass of the equivalent system
 
-    T_ADRS_CURVE capacity;                  // index = step; 0 is a tenth of step 1
+    T_ADRS_CURVE capacity;                  // by index of `steps`; 0 is a tenth of the first step
+    std::vector<int> steps{};               // their numbers; empty: the index is the number
     T_ADRS_CURVE demand;                    // the record at its own damping; NTC: SLV
     std::vector<T_ADRS_CURVE> stateDemands; // NTC: SLO, SLD, SLV, SLC; empty where not enabled
     SPECTRUM_SHOW shownOver = SPECTRUM_SHOW::Displacement; // as the spectrum is set to show itself
@@ -121,6 +122,19 @@ struct T_PUSH_EVALUATION {
     bool elastic = false;  // a target displacement on a curve that never leaves its first line
     T_OUTCOME outcome;
     std::vector<zql::frx::T_MESSAGE> messages;
+
+    /// Number of the step at an index of the curve, and the index of a step; empty: it is not on
+    /// it.
+    int StepAt(std::size_t index) const
+    {
+        return index < steps.size() ? steps[index] : static_cast<int>(index);
+    }
+    std::optional<std::size_t> IndexOf(int step) const
+    {
+        for (std::size_t i = 0; i < capacity.Sd.size(); ++i)
+            if (StepAt(i) == step) return i;
+        return std::nullopt;
+    }
 
     /// 0 not found, 1 found, 2 elastic, 3 beyond the push: each demand is larger than the curve's
     /// largest displacement, so that nothing on the curve belongs to it.

@@ -222,6 +222,7 @@ int CPushOverCurveData::PreparePOCurveData()
 {
     m_x = {0.0};
     m_y = {0.0};
+    m_steps = {0};
     m_maxX = m_maxY = 0.0;
     m_decreasingStep = 0;
     m_extra.fill({0.0});
@@ -231,8 +232,11 @@ int CPushOverCurveData::PreparePOCurveData()
         return 0;
     }
     const int steps = post.GetStepCount();
+    std::vector<T_RUN_STEP> ours;
+    (void)post.GetRunSteps(ours); // empty: another program's
     for (int i = 1; i <= steps; ++i) {
-        if (AppendStep(i)) continue;
+        const auto at = static_cast<std::size_t>(i - 1);
+        if ((at < ours.size() && ours[at].evaluated) || AppendStep(i)) continue;
         m_error = post.Error().empty() ? MMSGFunction::GetValue("IDS_QM_CURVE_NO_NODE_RESULTS")
                                        : post.Error();
         return 0;
@@ -252,12 +256,14 @@ int CPushOverCurveData::AppendStep(int step)
     force = std::fabs(force);
     displacement = std::fabs(displacement);
     TransformByPlotType(m_plotType, displacement, force);
-    if (!m_decreasingStep && step > 1 && displacement < m_x.back()) m_decreasingStep = step;
+    if (!m_decreasingStep && m_steps.size() > 1 && displacement < m_x.back())
+        m_decreasingStep = step;
     m_maxX = std::max(m_maxX, displacement);
     m_maxY = std::max(m_maxY, force);
     m_x.push_back(displacement);
     m_y.push_back(force);
-    if (step == 1) { // the curve starts at a tenth of its first step, on purpose
+    m_steps.push_back(step);
+    if (m_steps.size() == 2) { // the curve starts at a tenth of its first step, on purpose
         m_x[0] = displacement / 10.0;
         m_y[0] = force / 10.0;
     }

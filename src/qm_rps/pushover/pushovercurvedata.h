@@ -1,7 +1,8 @@
 // Assembly of the capacity curve of one pushover load case from the model's result steps.
 //
-// Index 0 is one tenth of the first step, index i is step i. Values are in current units; the
-// spectral plot types give Sd in the model's length unit and Sa in g.
+// Index 0 is one tenth of the first step, index i is step Steps()[i]: steps that a push of our own
+// has at what evaluations found are left out, so that these find the same again. Values are in
+// current units; the spectral plot types give Sd in the model's length unit and Sa in g.
 #pragma once
 
 #include "qm_db/dbdoc.h"
@@ -70,6 +71,8 @@ public:
 
     const std::vector<double>& Displacement() const { return m_x; }
     const std::vector<double>& Force() const { return m_y; }
+    /// Numbers of the steps by index; 0 stands for no step.
+    const std::vector<int>& Steps() const { return m_steps; }
     double MaxDisplacement() const { return m_maxX; }
     double MaxForce() const { return m_maxY; }
     const std::vector<double>& ExtraDisplacement(std::size_t i) const { return m_extra[i]; }
@@ -122,6 +125,7 @@ private:
     int m_decreasingStep = 0;
     double m_controlHeight = 0.0;
     std::vector<double> m_x, m_y;
+    std::vector<int> m_steps;
     std::array<std::vector<double>, 4> m_extra;
     double m_maxX = 0.0, m_maxY = 0.0;
     std::string m_error;

@@ -40,10 +40,10 @@ void AddPlaces(T_PLOT& plot, const T_PUSH_EVALUATION& e)
                                    line.kind == KIND::Demand ? PLOT_LINE::Dash : PLOT_LINE::DashDot,
                                    line.kind == KIND::Demand ? kRed : kGreen});
     for (const T_ADDITIONAL_STEP& s : e.additionalSteps) {
-        const auto i = static_cast<std::size_t>(s.step);
-        if (i < e.curve.x.size())
+        const auto i = e.IndexOf(s.step);
+        if (i && *i < e.curve.x.size())
             plot.labels.push_back(
-                {e.curve.x[i], e.curve.y[i], PlotStepText(s.step), PLOT_MARKER::Plus, false});
+                {e.curve.x[*i], e.curve.y[*i], PlotStepText(s.step), PLOT_MARKER::Plus, false});
     }
 }
 

@@ -241,7 +241,9 @@ T_TARGET_INPUT CPushEvaluator::TargetInput(CStepDrift& drift) const
     in.gamma = m_curve.Factors().gamma;
     in.mStar = m_curve.Factors().mass * m_curve.Factors().alpha / in.gamma;
     in.options = BilinearOptionsOf(m_eval);
-    in.drift = [&drift](int step) { return drift.Of(step); };
+    in.drift = [&drift, &steps = m_curve.Steps()](int index) {
+        return drift.Of(steps[static_cast<std::size_t>(index)]);
+    };
     in.spectra = TargetSpectraOf(m_spectrumRecord, m_eval.method, Damping().behaviorType);
     return in;
 }
@@ -269,10 +271,26 @@ int CPushEvaluator::UpdateTargetDispData()
     m_result.bilinear = evaluation.Bilinear();
     m_result.targets = evaluation.Targets();
     m_result.limitStates = evaluation.Rows();
+    for (T_LIMIT_ROW& row : m_result.limitStates) {
+        TakeStepNumber(row.demandStep);
+        TakeStepNumber(row.capacityStep);
+    }
     m_result.guideLines = evaluation.GuideLines();
     m_result.outcome = evaluation.Outcome();
-    if (m_storeSteps) StoreSteps(evaluation.DemandSteps());
+    if (!m_storeSteps) return found;
+    std::vector<int> demands;
+    for (std::optional<int> step : evaluation.DemandSteps()) {
+        TakeStepNumber(step);
+        demands.push_back(*step);
+    }
+    StoreSteps(demands);
     return found;
+}
+
+/// From an index of the curve; what stands for no step stays.
+void CPushEvaluator::TakeStepNumber(std::optional<int>& step) const
+{
+    if (step && *step > 0) step = m_curve.Steps()[static_cast<std::size_t>(*step)];
 }
 
 void CPushEvaluator::StoreSteps(const std::vector<int>& steps)
@@ -325,7 +343,7 @@ int CPushEvaluator::CalcAdditionalPerformancePoint(const std::string& spectrum, 
 
 void CPushEvaluator::ListStep(int step)
 {
-    const auto i = static_cast<std::size_t>(step);
+    const std::size_t i = m_result.IndexOf(step).value_or(0);
     const double Sd = m_result.capacity.Sd[i], Sa = m_result.capacity.Sa[i];
     T_ADDITIONAL_STEP row{step, Sd, Sa, Sd, Sa};
     TransferToDispAndReac(&row.D, &row.V);

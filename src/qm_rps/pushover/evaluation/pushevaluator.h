@@ -53,7 +53,7 @@ public:
     /// most 10. 1 kept; 0 full, no such spectrum, or no performance-point method (refusal).
     [[nodiscard]] int CalcAdditionalPerformancePoint(const std::string& spectrum,
                                                      T_FINDING& refusal);
-    /// Lists a step of the curve (1 to the last) beside the result.
+    /// Lists a step that is on the curve (T_PUSH_EVALUATION::IndexOf) beside the result.
     void ListStep(int step);
 
     /// Reads the result steps and builds the capacity spectrum. 1 done; 0 the outcome says why.
@@ -78,6 +78,7 @@ private:
     int UpdatePerformancePoint();
     T_TARGET_INPUT TargetInput(CStepDrift& drift) const;
     int UpdateTargetDispData();
+    void TakeStepNumber(std::optional<int>& step) const;
     void StoreSteps(const std::vector<int>& steps);
     void ForgetSteps();
     T_PERF_POINT MakePoint(double Dp, double Ap, std::optional<double> beta) const;

@@ -77,6 +77,7 @@ void CPushEvaluator::FillResult()
     if (m_result.factors.gamma != 0.0)
         m_result.mStar = m_result.factors.mass * m_result.factors.alpha / m_result.factors.gamma;
     m_result.capacity = Capacity();
+    if (!m_result.capacity.Sd.empty()) m_result.steps = m_curve.Steps();
     m_result.demand = Demand();
     m_result.reduced = PerfPointSpectrum();
     m_result.working = WorkingDemand();

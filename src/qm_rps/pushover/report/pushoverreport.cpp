@@ -256,7 +256,7 @@ std::string PushoverCurveText(const T_PUSH_EVALUATION& e)
         s += MMSGFunction::Format("IDS_RPS_PUSHOVER__step____20s____20s_n", {hx, hy});
     s += dashes;
     for (std::size_t i = 0; i < c.x.size(); ++i) {
-        const int step = static_cast<int>(i);
+        const int step = e.StepAt(i);
         const std::string note = Annotation(c.type, c.x[i]);
         if (status)
             s += FormatText("%20d    %20.5e %-14s   %25.5e  %25s\n", step, c.x[i], note.c_str(),
