@@ -86,6 +86,11 @@ public:
         PutTarget(*record.control, increments.target, stage);
         PutStops(record, control, stage.stops);
         if (!BuildPattern(m_model, m_frame, record, m_modeShape, stage.loads, error)) return 0;
+        // By load the push finds its way; only the displacement and the reaction say nothing of it.
+        if (stage.control != solver::PUSH_CONTROL::LoadFactor &&
+            !PushesAlong(stage.loads, m_frame, static_cast<std::size_t>(stage.direction)))
+            return Fail(error, Say("IDS_QM_PUSH_CASE_ACROSS",
+                                   kDirectionNames[static_cast<std::size_t>(stage.direction)]));
         out = std::move(stage);
         return 1;
     }

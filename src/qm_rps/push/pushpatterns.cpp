@@ -12,6 +12,24 @@ namespace {
 using solver::T_VEC3;
 using solver::T_VEC6;
 
+/// Beside the largest force what rounding leaves of forces that cancel, of direction cosines
+/// (1e-16) and of calculated shapes (1e-10).
+constexpr double kRounding = 1e-9;
+
+double LargestOf(const std::vector<T_VEC3>& forces)
+{
+    double most = 0.0;
+    for (const T_VEC3& f : forces)
+        for (const double v : f)
+            most = std::max(most, std::fabs(v));
+    return most;
+}
+
+bool HasStrain(const solver::T_LOAD_CASE& loads)
+{
+    return !loads.settlement.empty() || !loads.temperature.empty() || !loads.pretension.empty();
+}
+
 int Fail(std::string& error, std::string text)
 {
     error = std::move(text);
@@ -26,7 +44,9 @@ public:
     {
     }
 
-    int Add(const T_POLC_PATTERN& row, solver::T_LOAD_CASE& to, std::string& error) const
+    /// largest: becomes the largest force of a row.
+    int Add(const T_POLC_PATTERN& row, solver::T_LOAD_CASE& to, double& largest,
+            std::string& error) const
     {
         solver::T_LOAD_CASE one;
         int done = 0;
@@ -40,6 +60,8 @@ public:
         if (!done) return 0;
         if (!HasLoad(one, m_frame.Frame())) return Fail(error, Say("IDS_QM_PUSH_PATTERN_EMPTY"));
         AddLoads(to, one, row.factor);
+        largest =
+            std::max(largest, std::fabs(row.factor) * LargestOf(NodeForces(one, m_frame.Frame())));
         return 1;
     }
 
@@ -172,16 +194,29 @@ int BuildPattern(const T_MODEL& model, const CAnalysisModel& frame, const T_POLC
     if (record.patterns.empty()) return Fail(error, Say("IDS_QM_PUSH_NO_PATTERN"));
     const CRows rows(model, frame, modeShape);
     solver::T_LOAD_CASE loads;
+    double largest = 0.0;
     for (std::size_t i = 0; i < record.patterns.size(); ++i) {
         std::string why;
-        if (!rows.Add(record.patterns[i], loads, why))
+        if (!rows.Add(record.patterns[i], loads, largest, why))
             return Fail(error, Say("IDS_QM_PUSH_PATTERN_ROW", std::to_string(i + 1), why));
     }
-    if (!HasLoad(loads, frame.Frame())) return Fail(error, Say("IDS_QM_PUSH_PATTERN_EMPTY"));
+    const double left = LargestOf(NodeForces(loads, frame.Frame()));
+    if (largest > 0.0 && left <= kRounding * largest && !HasStrain(loads))
+        return Fail(error, Say("IDS_QM_PUSH_PATTERN_CANCELS"));
     if (record.eccentricity != 0.0 && !AddEccentricity(model, frame, record, loads, error))
         return 0;
     out = std::move(loads);
     return 1;
+}
+
+bool PushesAlong(const solver::T_LOAD_CASE& loads, const CAnalysisModel& frame,
+                 std::size_t direction)
+{
+    const std::vector<T_VEC3> forces = NodeForces(loads, frame.Frame());
+    const double largest = LargestOf(forces);
+    if (direction > 2 || largest == 0.0 || HasStrain(loads)) return true;
+    return std::ranges::any_of(
+        forces, [&](const T_VEC3& f) { return std::fabs(f[direction]) > kRounding * largest; });
 }
 
 int BuildInitialLoads(const CAnalysisModel& frame, const std::vector<T_PUSH_INITIAL_LOAD>& loads,

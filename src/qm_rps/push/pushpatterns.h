@@ -20,11 +20,16 @@ using MODE_SHAPE_FN = std::function<std::vector<solver::T_VEC6>(int mode, std::s
 /// spread as forces that grow with the distance from the centre of mass (mass times distance, as of
 /// a rotation), which is exact for a rigid diaphragm; nodes at one point take it as a moment.
 ///
-/// 1 done; 0 `error` says why: no rows, no force in a row or in all of them, no mass, no such mode
+/// 1 done; 0 `error` says why: no rows, no force in a row, rows that cancel, no mass, no such mode
 /// or load case, an eccentricity without storeys or without an extent. `out` is then unchanged.
 [[nodiscard]] int BuildPattern(const T_MODEL& model, const CAnalysisModel& frame,
                                const T_POLC_D& record, const MODE_SHAPE_FN& modeShape,
                                solver::T_LOAD_CASE& out, std::string& error);
+
+/// Whether some force of the loads has a part along a global direction (0 to 5) that is more than
+/// rounding. Loads that move by strains or moments alone, and rotations, are not judged: true.
+bool PushesAlong(const solver::T_LOAD_CASE& loads, const CAnalysisModel& frame,
+                 std::size_t direction);
 
 /// Static load cases times their factors. 1 done; 0 `error` names one that is not there.
 [[nodiscard]] int BuildInitialLoads(const CAnalysisModel& frame,
