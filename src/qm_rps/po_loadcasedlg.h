@@ -28,7 +28,7 @@ public:
     /// Checks, then stores in the document as one edit that can be undone; evaluations follow a
     /// new name. A new load case gets the next key. 0 with a message, the document as it was; so
     /// too where the stored case or the units have changed since it was read (another edit, an
-    /// undo, another model).
+    /// undo, another model). Stops that can't act are said (StopWarnings) and stored.
     int OnOK() override;
     /// A new load case of a document: with control data and a name that is free.
     static T_POLC_D MakeNew(CDBDoc& doc);

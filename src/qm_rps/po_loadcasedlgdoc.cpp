@@ -1,6 +1,7 @@
 // The load case dialog on a document: which case it edits, what the document asks of it, storing.
 #include "qm_base/msgfunction.h"
 #include "qm_rps/po_loadcasedlg.h"
+#include "qm_rps/push/stopwarnings.h"
 #include "qm_rps/pushover/loadcasedocrules.h"
 
 #include <algorithm>
@@ -126,6 +127,8 @@ int CPO_LoadCaseDlg::OnOK()
     const int before = m_key;
     if (Edit("IDS_QM_UI_TABLE_PUSHOVERS", [&](CEditScope& edit) { return Store(edit, record); })) {
         KeepRead();
+        for (const T_FINDING& warning : StopWarnings(*Doc(), record))
+            ShowMessage(warning.messageKey, warning.text);
         return 1;
     }
     m_key = before;

@@ -187,6 +187,8 @@ void CPushOverRunDlg::AddRow(const T_PUSH_RUN& run)
               run.status != PUSH_STATUS::Failed,
               run.loadFactor.size(),
               run.direction};
+    for (const std::string& warning : run.warnings)
+        row.advice += " " + warning;
     if (row.steps > 0) {
         row.loadFactor = run.loadFactor.back();
         row.displacement = run.displacement.back();

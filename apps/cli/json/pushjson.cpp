@@ -32,6 +32,7 @@ private:
         m_w.Key("outcome").Object(kJsonOneLine);
         m_w.Member("name", run.outcome).Member("advice", run.advice);
         m_w.End();
+        if (!run.warnings.empty()) m_w.Items("warnings", run.warnings, kJsonOneLine);
         Series("load_factor", run.loadFactor, kDimNone);
         Series("displacement", run.displacement, displacement);
         Series("base_reaction", run.baseReaction, force);

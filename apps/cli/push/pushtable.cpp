@@ -49,6 +49,8 @@ std::string PushTable(const T_PUSH_RUN& run, const T_UNITS& units, std::size_t m
 {
     std::string text = "\n== " + run.name + ": " + PushStatusText(run.status) + " (" +
                        PushOutcomeText(run.data.head.end.outcome) + ")\n" + run.advice + "\n";
+    for (const std::string& warning : run.warnings)
+        text += "! " + warning + "\n";
     const std::vector<std::size_t> rows = Rows(run, mostRows);
     if (rows.empty()) return text + Say("IDS_QM_CLI_PUSH_NO_STEP") + "\n";
     const bool turns = run.direction > 2;

@@ -3,6 +3,7 @@
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
 #include "qm_db/recordfacts.h"
+#include "qm_rps/push/stopwarnings.h"
 #include "qm_rps/pushover/loadcaserows.h"
 #include "json/jsontext.h"
 
@@ -76,6 +77,7 @@ public:
         m_text.append(WidthOf(text) < kColumn ? kColumn - WidthOf(text) : 1, ' ');
         m_text += value + (isGlobal ? "  (" + Say("IDS_QM_CLI_SETUP_GLOBAL") + ")" : "") + "\n";
     }
+    void Line(const std::string& text) { m_text += "  " + text + "\n"; }
     const std::string& Text() const { return m_text; }
 
 private:
@@ -102,7 +104,10 @@ public:
         m_table.Row("IDS_QM_UI_POGC_MOST_STEPS", std::to_string(control.mostSteps));
         for (const int key : cases) {
             T_POLC_D record;
-            if (doc.Attr().GetPolc(key, record)) AddCase(record);
+            if (!doc.Attr().GetPolc(key, record)) continue;
+            AddCase(record);
+            for (const T_FINDING& warning : StopWarnings(doc, record))
+                m_table.Line("! " + warning.field + ": " + warning.text);
         }
         return m_table.Text();
     }
@@ -262,8 +267,9 @@ void WriteStops(CJsonText& w, const T_PUSH_STOPS_D& stops)
     w.End();
 }
 
-void WriteCase(CJsonText& w, const T_MODEL& model, const T_POLC_D& record)
+void WriteCase(CJsonText& w, CDBDoc& doc, const T_POLC_D& record)
 {
+    const T_MODEL& model = doc.Data().Model();
     w.Object();
     w.Member("name", record.name).Member("control_node", record.controlNode);
     w.Member("direction", WordOf(kDirectionNames, record.direction - 1));
@@ -287,6 +293,10 @@ void WriteCase(CJsonText& w, const T_MODEL& model, const T_POLC_D& record)
     WriteStops(w, record.stops);
     w.Items("additional_displacements", record.additionalDisplacements, kJsonOneLine);
     w.Member("additional_evaluations", record.additionalEvaluations);
+    std::vector<std::string> warnings;
+    for (const T_FINDING& warning : StopWarnings(doc, record))
+        warnings.push_back(warning.field + ": " + warning.text);
+    if (!warnings.empty()) w.Items("warnings", warnings, kJsonOneLine);
     w.End();
 }
 
@@ -310,7 +320,7 @@ std::string SetupJson(CDBDoc& doc, const std::vector<int>& cases)
     w.Key("pushover").List();
     for (const int key : cases) {
         T_POLC_D record;
-        if (doc.Attr().GetPolc(key, record)) WriteCase(w, model, record);
+        if (doc.Attr().GetPolc(key, record)) WriteCase(w, doc, record);
     }
     w.End();
     w.End();

@@ -3,6 +3,7 @@
 #include "qm_base/say.h"
 #include "qm_rps/push/loadalgebra.h"
 #include "qm_rps/push/pushcollector.h"
+#include "qm_rps/push/stopwarnings.h"
 #include "qm_solver/framesolver.h"
 
 #include <algorithm>
@@ -193,6 +194,8 @@ int CPushRun::Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_
     T_PREPARED* on = nullptr;
     std::vector<T_PUSH_CASE> cases;
     if (!PrepareCases(key, cases, on, error)) return 0;
+    const auto warnings = StopWarnings(m_model.pushovers.at(key).stops,
+                                       !StoreysOf(m_model, m_frame, 0).empty(), on->hinges.laws);
     std::vector<T_PUSH_RUN> runs;
     for (T_PUSH_CASE& c : cases) {
         std::vector<double>& additional = c.stages.back().additional;
@@ -202,6 +205,8 @@ int CPushRun::Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_
             error = Say("IDS_QM_PUSH_CASE_QUOTED", m_model.pushovers.at(key).name) + ": " + error;
             return 0;
         }
+        for (const T_FINDING& warning : warnings)
+            runs.back().warnings.push_back(warning.field + ": " + warning.text);
         if (runs.back().cancelled) break;
     }
     out.insert(out.end(), std::make_move_iterator(runs.begin()),

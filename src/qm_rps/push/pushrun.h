@@ -43,6 +43,7 @@ struct T_PUSH_RUN {
     std::size_t direction = 0; // 0 to 5
     PUSH_STATUS status = PUSH_STATUS::Failed;
     std::string outcome, advice;
+    std::vector<std::string> warnings; // of a run: stops that could not act
     bool cancelled = false;
     std::vector<double> loadFactor, displacement, baseReaction, residual;
     std::vector<int> additional; // numbers of the steps that were asked for
