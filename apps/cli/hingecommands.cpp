@@ -7,6 +7,7 @@
 #include "qm_rps/hinge/hingetypefindings.h"
 #include "qm_rps/po_hingetypedlg.h"
 #include "qm_rps/po_hingetypelistdlg.h"
+#include "qm_rps/push/stopwarnings.h"
 #include "qm_rps/pushoverhingelistdlg.h"
 
 namespace {
@@ -176,18 +177,28 @@ EXIT_CODE RunCaseCheck(const std::string& file)
 {
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, file); code != EXIT_CODE::Done) return code;
-    std::size_t findings = 0;
-    for (const auto& entry : doc.Data().Model().pushovers) {
+    const T_MODEL& model = doc.Data().Model();
+    std::size_t findings = 0, warnings = 0;
+    const auto print = [&](const std::string& what, const std::vector<T_FINDING>& all) {
+        for (const T_FINDING& f : all)
+            std::printf("%s: %s: %s\n", what.c_str(), f.field.c_str(), f.text.c_str());
+        findings += all.size();
+    };
+    print(Say("IDS_QM_UI_POGC_TITLE"), PushControlFindings(model.pushControl, model));
+    for (const auto& [key, function] : model.incrementFunctions)
+        print(Say("IDS_QM_CASE_FUNCTION", function.name), IncrementFunctionFindings(function));
+    for (const auto& entry : model.pushovers) {
         T_POLC_D polc;
         if (!doc.Attr().GetPolc(entry.first, polc)) continue;
-        std::vector<T_FINDING> all = LoadCaseFindings(polc, doc.Data().Model());
-        const auto rows = PatternFindings(polc.patterns);
-        all.insert(all.end(), rows.begin(), rows.end());
-        for (const T_FINDING& f : all)
-            std::printf("%s: %s: %s\n", polc.name.c_str(), f.field.c_str(), f.text.c_str());
-        findings += all.size();
+        print(polc.name, LoadCaseFindings(polc, model));
+        print(polc.name, PatternFindings(polc.patterns));
+        for (const T_FINDING& f : StopWarnings(doc, polc)) {
+            PrintLine(Say("IDS_QM_CLI_CASE_WARNING", polc.name, f.field, f.text));
+            ++warnings;
+        }
     }
-    PrintLine(Say("IDS_QM_CLI_HINGE_CASE_FINDINGS",
-                  std::to_string(doc.Data().Model().pushovers.size()), std::to_string(findings)));
+    PrintLine(Say("IDS_QM_CLI_HINGE_CASE_FINDINGS", std::to_string(model.pushovers.size()),
+                  std::to_string(findings)));
+    if (warnings > 0) PrintLine(Say("IDS_QM_CLI_HINGE_WARNINGS", std::to_string(warnings)));
     return findings == 0 ? EXIT_CODE::Done : EXIT_CODE::NotFound;
 }

@@ -74,6 +74,9 @@ public:
             const auto f = m_model.incrementFunctions.find(record.control->incrementFunction);
             if (f == m_model.incrementFunctions.end())
                 return Fail(error, Say("IDS_RPS_PO_Error_No_Increment_Function"));
+            for (const T_FINDING& wrong : IncrementFunctionFindings(f->second))
+                return Fail(error, Say("IDS_QM_CASE_FUNCTION", f->second.name) + ": " +
+                                       wrong.field + ": " + wrong.text);
             increments = IncrementsOf(f->second);
         }
         if (increments.fractions.empty() ||

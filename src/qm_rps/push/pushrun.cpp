@@ -174,6 +174,10 @@ int CPushRun::PrepareCases(int key, std::vector<T_PUSH_CASE>& out, T_PREPARED*& 
         error = Say("IDS_QM_PUSH_NO_INITIAL_CASE");
         return 0;
     }
+    for (const T_FINDING& wrong : PushControlFindings(m_model.pushControl, m_model)) {
+        error = Say("IDS_QM_UI_POGC_TITLE") + ": " + wrong.field + ": " + wrong.text;
+        return 0;
+    }
     if (!BuildFrame(error)) return 0;
     std::vector<int> chain;
     T_PUSH_BASIS basis;
