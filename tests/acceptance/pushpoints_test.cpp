@@ -117,18 +117,51 @@ TEST_F(PushPoints, AreStepsOfAPushByLoadToo)
 {
     const json expected =
         json::parse(ReadText(ProjectFolder() / "tests/data/push/pc_two_storey.expected.json"));
-    json byLoad = Frame(1.0);
-    byLoad["pushover"][0]["control"] = {{"increment_method", "force"}};
-    byLoad["pushover"][0]["patterns"][0]["factor"] = 85.0;
-    byLoad["evaluations"].erase(0);
-    const json all = Evaluated(byLoad, 0);
-    const json& reached = all[0].at("hinges_at");
-    ASSERT_EQ(1U, reached.size());
-    EXPECT_EQ("DL", reached[0].at("point"));
-    const double d = reached[0].at("displacement"), close = 1e-9 * expected["peak"].get<double>();
-    const double share = reached[0].at("load_factor"); // of 85 times the loads
-    EXPECT_NEAR(FactorAt(expected["path"], d), 85.0 * share, close);
-    EXPECT_EQ(2U, all[0].at("hinges_not_at").size());
+    for (const double side : {1.0, -1.0}) { // backwards by the sign of the loads alone
+        json byLoad = Frame(side);
+        byLoad["pushover"][0]["control"] = {{"increment_method", "force"}};
+        byLoad["pushover"][0]["patterns"][0]["factor"] = 85.0;
+        byLoad["evaluations"].erase(0);
+        const json all = Evaluated(byLoad, 0);
+        const json& reached = all[0].at("hinges_at");
+        ASSERT_EQ(1U, reached.size());
+        EXPECT_EQ("DL", reached[0].at("point"));
+        const double d = side * reached[0].at("displacement").get<double>();
+        const double share = reached[0].at("load_factor"); // of 85 times the loads
+        EXPECT_NEAR(FactorAt(expected["path"], d), 85.0 * share,
+                    1e-9 * expected["peak"].get<double>());
+        EXPECT_EQ(2U, all[0].at("hinges_not_at").size());
+    }
+}
+
+TEST_F(PushPoints, StayWhereTheyWereWhenTheyAreSteps)
+{
+    json file = Frame(1.0);
+    file["pushover"][0]["steps"] = 7;
+    const json before = Evaluated(file, 0);
+    file["pushover"][0]["additional_evaluations"] = true;
+    Write("c.json", file.dump(1));
+    Done("push c.json -o m.qmdb");
+    for (int times = 1; times <= 3; ++times) {
+        const json after = Json("evaluate m.qmdb");
+        const double D = before[0].at("performance_point").at("D");
+        EXPECT_NEAR(D, after[0].at("performance_point").at("D").get<double>(), 1e-12) << times;
+        for (const std::size_t state : {0U, 1U})
+            EXPECT_NEAR(before[1]["limit_states"][state].at("demand").get<double>(),
+                        after[1]["limit_states"][state].at("demand").get<double>(), 1e-12);
+        // steps are told by their numbers in the push, which has more of them
+        const json run = Json("push m.qmdb")[0];
+        ASSERT_EQ(3U, run.at("additional").size()); // the point and the demands of DL and SD
+        const json& numbers = after[0].at("capacity").at("step");
+        EXPECT_EQ(1U + 7U, numbers.size());
+        for (const json& added : run["additional"])
+            EXPECT_EQ(numbers.end(), std::find(numbers.begin(), numbers.end(), added));
+        const auto near = after[1]["limit_states"][1].at("demand_step").get<std::size_t>();
+        EXPECT_NEAR(0.3, run["displacement"].at(near - 1).get<double>(), 1e-9); // next to 0.28
+    }
+    const T_RUN listed = Run("evaluate m.qmdb --only A --add-step 3 --no-store");
+    EXPECT_EQ(2, listed.code);
+    ExpectHolds(listed.err, {"was added to the push"});
 }
 
 TEST_F(PushPoints, AreNotOfCurvesOfAnotherProgram)

@@ -165,3 +165,17 @@ TEST_F(LoadCaseEdit, WhatHasChangedElsewhereIsNotOverwritten)
     EXPECT_EQ(0, first.OnOK());
     EXPECT_EQ("PX_MODE1", Model().pushovers.at(1).name);
 }
+
+TEST(LoadCaseWarnings, StopsThatCantActAreSaidAndStored)
+{
+    CDBDoc doc;
+    T_FILE_ERROR error;
+    ASSERT_EQ(1, doc.ImportCase(QM_TEST_DATA "/push/pc_two_storey.json", error)) << error.text;
+    CPO_LoadCaseDlg dialog;
+    dialog.SetDoc(&doc);
+    dialog.m_case.stops = {0.03, PUSH_STATE_STOP::CP, {}}; // there are storeys, but no criteria
+    EXPECT_EQ(1, dialog.OnOK());
+    ASSERT_EQ(1U, dialog.Messages().size());
+    EXPECT_EQ("IDS_QM_PUSH_STOP_NO_CRITERIA", dialog.Messages()[0].key);
+    EXPECT_EQ(dialog.m_case.stops, doc.Data().Model().pushovers.at(dialog.Key()).stops);
+}

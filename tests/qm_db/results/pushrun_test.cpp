@@ -21,7 +21,7 @@ T_RUN_DATA LongRun(int steps)
 {
     T_RUN_DATA run;
     run.head = {
-        0, 0.0, {0, 0, 0, 0, 0, 0}, -3.5, {1, 2, 3, ~0ULL}, {O::SnapBack, 1, -0.0, 0.25, 7}};
+        0, 0.0, {0, 0, 0, 0, 0, 0}, -3.5, {1, 2, 3, ~0ULL}, {O::SnapBack, 1, -0.0, 0.25, 7, 14, 2}};
     run.head.control[1] = 1.0;
     for (int n = 1; n <= 170; ++n) {
         run.nodes.push_back(10 * n);
@@ -31,7 +31,8 @@ T_RUN_DATA LongRun(int steps)
         run.hinges.push_back({h / 2 + 1, 0.5 * (h % 3), h % 6});
     for (int s = 1; s <= steps; ++s) {
         const double v = s;
-        run.steps.push_back({s % 2, v / 8, v / 4, -v, {v, -v, 3, 4, 5, 6}, 1e-12 * v, s == 2});
+        run.steps.push_back(
+            {s % 2, v / 8, v / 4, -v, {v, -v, 3, 4, 5, 6}, 1e-12 * v, s % 2 == 0, s == 4});
         auto& shape = run.displacement.emplace_back();
         for (int n = 0; n < 170; ++n)
             shape.push_back({v, 1000.0 * n + v, -0.0, 1.0 / (n + 1), 5, 6});
@@ -91,7 +92,7 @@ TEST(PushRun, TakesTheEngineStepByStepInTheIdsOfTheModel)
 
     const T_RUN_DATA run = recorder.Take();
     EXPECT_EQ(PrintOfPush(model, 2), run.head.print);
-    EXPECT_EQ((T_RUN_END{O::Cancelled, 1, 0.5, 0.1, 8}), run.head.end);
+    EXPECT_EQ((T_RUN_END{O::Cancelled, 1, 0.5, 0.1, 8, 1, 0}), run.head.end);
     EXPECT_EQ((std::vector<T_RUN_HINGE>{{8, 1.0, 4}, {8, 1.0, 5}, {3, 0.0, 5}}), run.hinges);
     EXPECT_EQ((std::vector<T_RUN_STATE>{{0.1, 1, -50, 2}, {0.2, 2, -50, -1}, {0.3, 3, 60, 0}}),
               run.states.at(0));
@@ -154,6 +155,28 @@ TEST(PushRun, ComesBackFromTheModelFileWholeAndInPart)
         EXPECT_EQ(0, r.ReadNode(11, u));
         EXPECT_FALSE(r.HasNode(11));
     }
+}
+
+// Written by the program when it knew that version only: a frame stopped by a drift.
+TEST(PushRun, OfAnOlderFileDoesNotSayWhereItEnded)
+{
+    const CTempFolder folder;
+    const std::string path = folder.File("model.qmdb");
+    WriteBytes(path, BytesOf(QM_TEST_DATA "/model-v5.qmdb"));
+    ASSERT_EQ(5, BytesOf(path)[63]); // user_version, last byte
+    T_MODEL_CONTENT content;
+    T_FILE_ERROR error;
+    CModelStore store;
+    ASSERT_EQ(1, store.Open(path, OPEN_MODE::Edit, content, error)) << error.text;
+    const T_RUN_DATA run = Whole(*content.results.at(1));
+    EXPECT_EQ(O::DriftStop, run.head.end.outcome);
+    EXPECT_NEAR(0.13284, run.head.end.displacement, 5e-6); // as it was printed
+    EXPECT_EQ(0, run.head.end.hinge);
+    EXPECT_EQ(0, run.head.end.storey);
+    ASSERT_EQ(1, store.Save(path, content, error)) << error.text;
+    EXPECT_EQ(6, BytesOf(path)[63]);
+    ASSERT_EQ(1, store.Open(path, OPEN_MODE::Edit, content, error)) << error.text;
+    EXPECT_EQ(run, Whole(*content.results.at(1)));
 }
 
 // What is not asked for is not read: a damaged block elsewhere does not matter.
