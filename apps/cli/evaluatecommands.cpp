@@ -4,6 +4,8 @@
 #include "output.h"
 #include "push/pushfirst.h"
 #include "qm_base/say.h"
+#include "qm_db/recordfacts.h"
+#include "qm_rps/evaluatedsteps.h"
 #include "qm_rps/push/pushatpointtext.h"
 #include "qm_rps/push/pushended.h"
 #include "qm_rps/pushover/evaluation/pushovercomparison.h"
@@ -65,32 +67,47 @@ bool AddExtras(CPushOverCurveDlg& driver, const T_EVALUATE_OPTIONS& options, boo
 /// Why the results of this push could not be read (a damaged block); empty when they could.
 std::string ReadFault(CDBDoc& doc, const std::string& push)
 {
-    int key = 0;
-    if (!doc.Attr().FindPolc(push, key)) return {};
+    const auto name = FindPush(doc.Data().Model(), push);
+    if (!name) return {};
+    if (const IPushRun* const run = doc.Post().RunOf(name->key, name->turn)) return run->Error();
     const T_RESULT_MAP& results = doc.Data().Content().results;
-    const auto it = results.find(key);
-    return it == results.end() ? std::string() : it->second->Error();
+    const auto it = results.find(name->key);
+    return name->turn != 0 || it == results.end() ? std::string() : it->second->Error();
 }
 
-/// Evaluates what was asked for. `extras`: whether every additional step and point was listed.
+/// What was asked for.
+std::vector<T_EVAL_D> AskedFor(CDBDoc& doc, const T_EVALUATE_OPTIONS& o)
+{
+    std::vector<T_EVAL_D> all = EvaluationsOf(doc, o.only);
+    std::erase_if(all, [&](const T_EVAL_D& eval) {
+        return !o.push.empty() && eval.push != o.push && !IsTurnOf(eval.push, o.push);
+    });
+    return all;
+}
+
+EXIT_CODE NothingAsked(const CDBDoc& doc, const T_EVALUATE_OPTIONS& o)
+{
+    if (!o.only.empty())
+        return Complain(EXIT_CODE::Usage,
+                        doc.Path() + ": " + Say("IDS_QM_CLI_NO_EVALUATION", o.only));
+    if (!o.push.empty())
+        return Complain(EXIT_CODE::Usage,
+                        doc.Path() + ": " + Say("IDS_QM_CLI_NO_EVALUATION_OF", o.push));
+    return Complain(EXIT_CODE::BadInput, doc.Path() + ": " + Say("IDS_QM_CLI_NO_EVALUATIONS"));
+}
+
+/// `extras`: whether every additional step and point was listed.
 EXIT_CODE EvaluateAll(CDBDoc& doc, const T_EVALUATE_OPTIONS& options,
                       std::vector<T_PUSH_EVALUATION>& out, bool& extras)
 {
-    const std::string& only = options.only;
     CPushOverCurveDlg driver(doc);
     driver.SetSpectrumShow(SPECTRUM_SHOW::Period);
-    const auto asked = [&](const T_EVAL_D& eval) { return only.empty() || eval.name == only; };
-    const bool points = std::ranges::any_of(doc.Data().Model().evaluations, [&](const auto& e) {
-        return asked(e.second) && e.second.method < PUSH_METHOD::Ec8Opcm;
-    });
-    const auto total = static_cast<std::size_t>(std::ranges::count_if(
-        doc.Data().Model().evaluations, [&](const auto& e) { return asked(e.second); }));
+    const std::vector<T_EVAL_D> all = AskedFor(doc, options);
+    const bool points = std::ranges::any_of(
+        all, [](const T_EVAL_D& eval) { return eval.method < PUSH_METHOD::Ec8Opcm; });
     const auto progress = ProgressOf(doc);
-    for (const auto& entry : doc.Data().Model().evaluations) {
-        if (!asked(entry.second)) continue;
-        progress(out.size(), total);
-        T_EVAL_D eval;
-        if (!doc.Attr().GetEval(entry.first, eval)) continue;
+    for (const T_EVAL_D& eval : all) {
+        progress(out.size(), all.size());
         if (!driver.SetEvaluation(eval))
             return Complain(EXIT_CODE::BadInput,
                             doc.Path() + ": " + Say("IDS_QM_CLI_EVALUATION_QUOTED", eval.name) +
@@ -101,22 +118,16 @@ EXIT_CODE EvaluateAll(CDBDoc& doc, const T_EVALUATE_OPTIONS& options,
         extras = AddExtras(driver, options, points) && extras;
         out.push_back(driver.Result());
     }
-    progress(total, total);
-    if (!out.empty()) return EXIT_CODE::Done;
-    if (only.empty())
-        return Complain(EXIT_CODE::BadInput, doc.Path() + ": " + Say("IDS_QM_CLI_NO_EVALUATIONS"));
-    return Complain(EXIT_CODE::Usage, doc.Path() + ": " + Say("IDS_QM_CLI_NO_EVALUATION", only));
+    progress(all.size(), all.size());
+    return out.empty() ? NothingAsked(doc, options) : EXIT_CODE::Done;
 }
 
 /// The load cases that the evaluations need are pushed where they have no results.
 EXIT_CODE PushEvaluated(CDBDoc& doc, const T_EVALUATE_OPTIONS& o)
 {
     std::set<int> keys;
-    for (const auto& [key, eval] : doc.Data().Model().evaluations) {
-        int push = 0;
-        if ((o.only.empty() || eval.name == o.only) && doc.Attr().FindPolc(eval.push, push))
-            keys.insert(push);
-    }
+    for (const T_EVAL_D& eval : AskedFor(doc, o))
+        if (const auto push = FindPush(doc.Data().Model(), eval.push)) keys.insert(push->key);
     return PushWhereMissing(doc, o.file, keys);
 }
 
@@ -219,8 +230,9 @@ EXIT_CODE RunCompare(const T_COMPARE_OPTIONS& o)
         return code;
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
-    if (int key = 0; doc.Attr().FindPolc(o.push, key))
-        if (const EXIT_CODE code = PushWhereMissing(doc, o.file, {key}); code != EXIT_CODE::Done)
+    if (const auto push = FindPush(doc.Data().Model(), o.push))
+        if (const EXIT_CODE code = PushWhereMissing(doc, o.file, {push->key});
+            code != EXIT_CODE::Done)
             return code;
     T_PUSH_COMPARISON comparison;
     CPushEvaluator evaluator(doc, RunPerfPtProcedure);
@@ -252,8 +264,7 @@ EXIT_CODE RunEvaluate(const T_EVALUATE_OPTIONS& o)
         if (const EXIT_CODE code = CheckPlotName(plot); code != EXIT_CODE::Done) return code;
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
-    const auto& evaluations = doc.Data().Model().evaluations;
-    const std::size_t count = o.only.empty() ? evaluations.size() : 1;
+    const std::size_t count = AskedFor(doc, o).size();
     if (const EXIT_CODE code = CheckOutputs(o.file, OutputsOf(o, count), o.overwrite);
         code != EXIT_CODE::Done)
         return code;

@@ -9,6 +9,7 @@
 struct T_EVALUATE_OPTIONS {
     std::string file;
     std::string only;                 // name of one evaluation; empty: all
+    std::string push;                 // name of their push or one direction of it; empty: all
     std::string json;                 // file, or "-" for standard output
     std::string report;               // text report
     std::string curve;                // curve table alone

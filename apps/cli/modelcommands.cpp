@@ -52,9 +52,9 @@ std::string InfoText(CDBDoc& doc)
              std::to_string(m.storeys.size()), std::to_string(m.modes.size()),
              std::to_string(m.spectra.size()), std::to_string(m.evaluations.size()));
     for (const auto& [key, polc] : m.pushovers) {
-        const auto result = doc.Data().Content().results.find(key);
-        const int steps =
-            result != doc.Data().Content().results.end() ? result->second->StepCount() : 0;
+        const bool isTurned = !doc.Post().SelectPushover(key);
+        const bool any = !isTurned || doc.Post().SelectPushover(key, 1);
+        const int steps = any ? doc.Post().GetStepCount() : 0;
         text += Line(2, "IDS_QM_CLI_INFO_PUSH", polc.name, std::to_string(steps),
                      std::to_string(polc.controlNode),
                      kDirectionNames[static_cast<std::size_t>(polc.direction - 1)],

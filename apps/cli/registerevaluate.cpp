@@ -12,6 +12,7 @@ void AddEvaluate(CLI::App& app, EXIT_CODE& code)
     auto o = std::make_shared<T_EVALUATE_OPTIONS>();
     AddFile(sub, o->file);
     sub->add_option("--only", o->only, Say("IDS_QM_HELP_EVALUATE_ONLY"));
+    sub->add_option("--push", o->push, Say("IDS_QM_HELP_EVALUATE_PUSH"));
     AddJson(sub, o->json);
     sub->add_option("--report", o->report, Say("IDS_QM_HELP_EVALUATE_REPORT"));
     sub->add_option("--curve", o->curve, Say("IDS_QM_HELP_EVALUATE_CURVE"));

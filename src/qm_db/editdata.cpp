@@ -1,5 +1,7 @@
 #include "qm_db/editdata.h"
 
+#include "qm_db/records/pushnames.h"
+
 #include <algorithm>
 #include <cmath>
 #include <ranges>
@@ -58,9 +60,9 @@ int CEditData::RenamePush(int key, const std::string& name)
     if (it == model.pushovers.end() || it->second.name == name) return 1;
     const std::string before = it->second.name;
     for (const auto& [other, stored] : model.evaluations) {
-        if (stored.push != before) continue;
+        if (stored.push != before && !IsTurnOf(stored.push, before)) continue;
         T_EVAL_D after = stored;
-        after.push = name;
+        after.push = name + stored.push.substr(before.size()); // with its direction
         if (!Change<T_EVAL_D>(other, std::make_shared<const T_EVAL_D>(std::move(after)))) return 0;
     }
     for (const auto& [other, stored] : model.pushovers) {

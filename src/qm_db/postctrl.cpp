@@ -261,11 +261,23 @@ int CPostCtrl::FindControlNode(int& node)
     return 1;
 }
 
+/// Mass that moves along the direction of control: of a turned push between the axes, of each its
+/// share.
+double CPostCtrl::MassAlong(const T_NODE_D& node) const
+{
+    const IPushRun* const run = RunOf(m_pushover, m_turn);
+    const auto direction = static_cast<std::size_t>(Direction());
+    if (!run || m_turn == 0) return direction < 3 ? node.mass[direction] : 0.0;
+    double mass = 0.0;
+    for (std::size_t d = 0; d < 3; ++d)
+        mass += run->Head().control[d] * run->Head().control[d] * node.mass[d];
+    return mass;
+}
+
 // In the units of the document; a level without results adds its height to the next one.
 int CPostCtrl::ReadLevels()
 {
     if (!m_levels.empty()) return 1;
-    const auto direction = static_cast<std::size_t>(Direction());
     double height = 0.0;
     for (const auto& [key, storey] : m_data.Model().storeys) {
         height += FromSi(storey.height, m_data.Units(), kDimLength);
@@ -279,7 +291,7 @@ int CPostCtrl::ReadLevels()
             }
             for (const std::size_t axis : {0U, 1U})
                 at.plan[axis] = FromSi(node->second.xyz[axis], m_data.Units(), kDimLength);
-            if (direction < 3) at.mass = node->second.mass[direction];
+            at.mass = MassAlong(node->second);
         }
         if (level.nodes.empty() || !(height > 0.0)) continue;
         if (!m_levels.empty()) PairWithBelow(level, m_levels.back());
@@ -290,10 +302,11 @@ int CPostCtrl::ReadLevels()
     return m_levels.empty() ? 0 : 1;
 }
 
-int CPostCtrl::GetPushoverStoryDrifts(int loadCase, int step, std::vector<T_STOREY_DRIFT>& out)
+int CPostCtrl::GetPushoverStoryDrifts(int loadCase, int step, std::vector<T_STOREY_DRIFT>& out,
+                                      int turn)
 {
     m_error.clear();
-    if (!SelectPushover(loadCase) || !SelectStep(step) || !ReadLevels()) return 0;
+    if (!SelectPushover(loadCase, turn) || !SelectStep(step) || !ReadLevels()) return 0;
     const auto index = static_cast<std::size_t>(step - 1);
     out.clear();
     for (std::size_t i = 0; i < m_levels.size(); ++i)
@@ -301,10 +314,11 @@ int CPostCtrl::GetPushoverStoryDrifts(int loadCase, int step, std::vector<T_STOR
     return 1;
 }
 
-int CPostCtrl::GetPushoverStoryDriftRatio(int loadCase, int step, double& kind1, double& kind2)
+int CPostCtrl::GetPushoverStoryDriftRatio(int loadCase, int step, double& kind1, double& kind2,
+                                          int turn)
 {
     std::vector<T_STOREY_DRIFT> drifts;
-    if (!GetPushoverStoryDrifts(loadCase, step, drifts)) return 0;
+    if (!GetPushoverStoryDrifts(loadCase, step, drifts, turn)) return 0;
     kind1 = kind2 = 0.0;
     for (const T_STOREY_DRIFT& drift : drifts) {
         kind1 = std::max(kind1, std::fabs(drift.plain));
@@ -313,13 +327,13 @@ int CPostCtrl::GetPushoverStoryDriftRatio(int loadCase, int step, double& kind1,
     return 1;
 }
 
-bool CPostCtrl::HasStoreyGaps(int loadCase) const
+bool CPostCtrl::HasStoreyGaps(int loadCase, int turn) const
 {
-    const auto source = m_data.Content().results.find(loadCase);
-    if (source == m_data.Content().results.end()) return false;
+    const IPushResult* const source = SourceOf(loadCase, turn);
+    if (!source) return false;
     const auto known = [&](const auto& entry) {
         return std::ranges::any_of(entry.second.nodes,
-                                   [&](int node) { return source->second->HasNode(node); });
+                                   [&](int node) { return source->HasNode(node); });
     };
     const auto& storeys = m_data.Model().storeys;
     return std::ranges::any_of(storeys, known) && !std::ranges::all_of(storeys, known);

@@ -140,15 +140,15 @@ public:
     /// Nodes without results do not count; a storey without any adds its height to the next one.
     /// 1 done; 0 no storeys or no results, outputs as they were.
     [[nodiscard]] int GetPushoverStoryDriftRatio(int loadCase, int step, double& kind1,
-                                                 double& kind2);
+                                                 double& kind2, int turn = 0);
 
     /// The same by storey, bottom to top, with signs.
     [[nodiscard]] int GetPushoverStoryDrifts(int loadCase, int step,
-                                             std::vector<T_STOREY_DRIFT>& out);
+                                             std::vector<T_STOREY_DRIFT>& out, int turn = 0);
 
     /// True when some storeys have nodes with results and others none: drifts then span several
     /// storeys.
-    bool HasStoreyGaps(int loadCase) const;
+    bool HasStoreyGaps(int loadCase, int turn = 0) const;
 
 private:
     template <class R>
@@ -173,6 +173,7 @@ private:
     IPushResult* SourceOf(int loadCase, int turn) const;
     IPushResult* Source() const { return SourceOf(m_pushover, m_turn); }
     int Direction() const; // 0 to 5
+    double MassAlong(const T_NODE_D& node) const;
     T_DIM DispDim() const;
     T_DIM ReacDim() const;
 

@@ -1,6 +1,7 @@
 #include "qm_rps/evaluatedsteps.h"
 
 #include "qm_base/say.h"
+#include "qm_db/recordfacts.h"
 #include "qm_rps/pushovercalculators.h"
 
 #include <algorithm>
@@ -55,16 +56,17 @@ std::string WhyNotPushed(const T_POLC_D& record)
 {
     constexpr int kFirstRotation = 4;
     if (record.direction >= kFirstRotation) return Say("IDS_QM_PUSH_AT_TURN");
-    const bool many = record.control && record.control->generateStaticAngle;
-    return many ? Say("IDS_QM_PUSH_AT_DIRECTIONS") : std::string();
+    return {};
 }
 
-/// A step of the run without those of evaluations is there: it stays one that these read.
-bool IsStep(const T_PUSH_RUN& run, double displacement)
+/// A step of a run without those of evaluations is there: it stays one that these read.
+bool IsStep(std::span<const T_PUSH_RUN> runs, double displacement)
 {
-    return std::ranges::any_of(run.displacement, [&](double d) {
+    const auto same = [&](double d) {
         return std::fabs(d - displacement) <= kSameDisplacement * std::fabs(displacement);
-    });
+    };
+    return std::ranges::any_of(
+        runs, [&](const T_PUSH_RUN& run) { return std::ranges::any_of(run.displacement, same); });
 }
 
 /// Displacements that the engine can be asked for.
@@ -76,83 +78,111 @@ std::vector<double> StepsAt(const T_POLC_D& record, const std::vector<T_PUSH_POI
     return out;
 }
 
+/// What is wanted of the results of one load case.
+struct T_WANTED {
+    T_HINGES_AT* to = nullptr;
+    int turn = 0;
+    std::vector<T_PUSH_POINT> points;
+};
+
 /// Pushes a load case to the points of its evaluations, and shares these out.
 void PushToPoints(CPushRun& push, int key, const T_POLC_D& record,
-                  const std::map<T_HINGES_AT*, std::vector<T_PUSH_POINT>>& wanted,
-                  const PUSH_PROGRESS_FN& progress)
+                  const std::vector<T_WANTED>& wanted, const PUSH_PROGRESS_FN& progress)
 {
     std::vector<T_PUSH_POINT> all;
-    for (const auto& [to, points] : wanted)
-        all.insert(all.end(), points.begin(), points.end());
+    for (const T_WANTED& one : wanted)
+        all.insert(all.end(), one.points.begin(), one.points.end());
     std::vector<T_PUSH_RUN> runs;
     std::string note = WhyNotPushed(record), error;
     if (note.empty() && !push.Run(key, progress, runs, error, StepsAt(record, all)))
         note = error;
-    else if (note.empty() && runs.front().cancelled)
+    else if (note.empty() && runs.back().cancelled)
         note = Say("IDS_QM_PUSH_AT_INTERRUPTED");
-    for (const auto& [to, points] : wanted) {
-        to->note = note;
-        if (note.empty()) to->points = PushAtPoints(runs.front(), points);
+    for (const T_WANTED& one : wanted) {
+        one.to->note = note;
+        const auto run = std::ranges::find(runs, one.turn, &T_PUSH_RUN::turn);
+        if (note.empty() && run != runs.end()) one.to->points = PushAtPoints(*run, one.points);
     }
 }
 
 } // namespace
+
+std::vector<T_EVAL_D> EvaluationsOf(CDBDoc& doc, const std::string& only)
+{
+    std::vector<T_EVAL_D> out;
+    const T_MODEL& model = doc.Data().Model();
+    for (const auto& entry : model.evaluations) {
+        T_EVAL_D eval;
+        if (!doc.Attr().GetEval(entry.first, eval) || (!only.empty() && eval.name != only))
+            continue;
+        const auto push = FindPush(model, eval.push);
+        std::vector<std::string> pushes{eval.push};
+        if (push && push->turn == 0 && !doc.Post().SelectPushover(push->key))
+            if (auto turned = TurnedNames(model.pushovers.at(push->key)); !turned.empty())
+                pushes = std::move(turned);
+        const std::string name = eval.name;
+        for (std::string& one : pushes) {
+            if (pushes.size() > 1) eval.name = name + ", " + one;
+            eval.push = std::move(one);
+            out.push_back(eval);
+        }
+    }
+    return out;
+}
 
 std::vector<T_HINGES_AT> HingesOfEvaluations(CDBDoc& doc,
                                              std::span<const T_PUSH_EVALUATION> results,
                                              const PUSH_PROGRESS_FN& progress)
 {
     std::vector<T_HINGES_AT> out(results.size());
-    std::map<int, std::map<T_HINGES_AT*, std::vector<T_PUSH_POINT>>> wanted; // by load case
+    std::map<int, std::vector<T_WANTED>> wanted; // by load case
+    const T_MODEL& model = doc.Data().Model();
     for (std::size_t i = 0; i < results.size(); ++i) {
         const T_PUSH_EVALUATION& e = results[i];
-        int key = 0;
+        const auto push = FindPush(model, e.eval.push);
+        IPushRun* const run = push ? doc.Post().RunOf(push->key, push->turn) : nullptr;
         std::string old;
-        if (!doc.Attr().FindPolc(e.eval.push, key) || !doc.Post().RunOf(key) ||
-            doc.Post().IsStale(key, old))
-            continue;
-        const int controlNode = doc.Data().Model().pushovers.at(key).controlNode;
+        if (!run || doc.Post().IsStale(push->key, old, push->turn)) continue;
         out[i].evaluation = e.eval.name.empty() ? MethodName(e.eval.method) : e.eval.name;
         out[i].push = e.eval.push;
         out[i].units = e.units;
-        if (e.loadCase.controlNode != controlNode) {
+        const int controlNode = model.pushovers.at(push->key).controlNode;
+        if (e.loadCase.controlNode != controlNode)
             out[i].note = Say("IDS_QM_PUSH_AT_OTHER_NODE", std::to_string(e.loadCase.controlNode),
                               std::to_string(controlNode));
-            continue;
-        }
-        std::vector<T_PUSH_POINT> points = PointsOf(e, WayOf(*doc.Post().RunOf(key), controlNode));
-        if (!points.empty()) wanted[key][&out[i]] = std::move(points);
+        if (!out[i].note.empty()) continue;
+        std::vector<T_PUSH_POINT> points = PointsOf(e, WayOf(*run, controlNode));
+        if (!points.empty()) wanted[push->key].push_back({&out[i], push->turn, std::move(points)});
     }
     CPushRun push(doc);
     for (const auto& [key, of] : wanted)
-        PushToPoints(push, key, doc.Data().Model().pushovers.at(key), of, progress);
+        PushToPoints(push, key, model.pushovers.at(key), of, progress);
     return out;
 }
 
 std::vector<double> StepsOfEvaluations(CDBDoc& doc, std::span<const T_PUSH_RUN> runs)
 {
-    if (runs.size() != 1 || runs.front().cancelled) return {};
-    const T_POLC_D record = doc.Data().Model().pushovers.at(runs.front().key);
-    if (!record.additionalEvaluations) return {};
     std::vector<double> out;
-    IPushRun* const stored = doc.Post().RunOf(runs.front().key);
-    if (!stored) return out;
-    const T_WAY way = WayOf(*stored, record.controlNode);
+    if (runs.empty() || runs.back().cancelled) return out;
+    const int key = runs.front().key;
+    const T_POLC_D record = doc.Data().Model().pushovers.at(key);
+    if (!record.additionalEvaluations) return out;
     CPushEvaluator evaluator(doc, RunPerfPtProcedure);
     evaluator.SetStoreSteps(false);
     evaluator.SetFindAllPoints(false);
-    for (const auto& entry : doc.Data().Model().evaluations) {
-        T_EVAL_D eval;
+    for (const T_EVAL_D& eval : EvaluationsOf(doc)) {
         T_FINDING refusal;
-        if (entry.second.push != record.name || !doc.Attr().GetEval(entry.first, eval) ||
-            !evaluator.SetEvaluation(eval, refusal) || evaluator.Evaluate() == 0 ||
+        const auto push = FindPush(doc.Data().Model(), eval.push);
+        IPushRun* const stored =
+            push && push->key == key ? doc.Post().RunOf(key, push->turn) : nullptr;
+        if (!stored || !evaluator.SetEvaluation(eval, refusal) || evaluator.Evaluate() == 0 ||
             evaluator.Result().loadCase.controlNode != record.controlNode)
             continue;
         const T_PUSH_EVALUATION& result = evaluator.Result();
+        const T_WAY way = WayOf(*stored, record.controlNode);
         const auto add = [&](double d) {
-            // an evaluation counts from the start of the push, a step is told by the whole
             const double si = way.At(ToSi(d, doc.Unit().Units(), kDimLength));
-            if (si != 0.0 && IsOnTheWay(record, si) && !IsStep(runs.front(), si)) out.push_back(si);
+            if (si != 0.0 && IsOnTheWay(record, si) && !IsStep(runs, si)) out.push_back(si);
         };
         if (result.point) add(result.point->D);
         for (const T_LIMIT_ROW& row : result.limitStates)

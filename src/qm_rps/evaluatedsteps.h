@@ -6,9 +6,14 @@
 
 #include <span>
 
+/// The evaluations of a document. One of a load case that is pushed in several directions stands
+/// for each of them, whose name ("P@90") is then that of its push and stands behind its own.
+/// only: the one of that name; empty: all.
+std::vector<T_EVAL_D> EvaluationsOf(CDBDoc& doc, const std::string& only = {});
+
 /// Displacements of the control node (m) at the performance points and targets of the evaluations
 /// of a load case, to be steps of its push; its results must be those of the document. Empty where
-/// the load case does not ask for them, was cancelled, or was pushed in several directions.
+/// the load case does not ask for them or was cancelled; directions between the axes have none.
 std::vector<double> StepsOfEvaluations(CDBDoc& doc, std::span<const T_PUSH_RUN> runs);
 
 /// What every hinge does at what the evaluations found: at performance points, and at the demands

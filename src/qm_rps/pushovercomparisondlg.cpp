@@ -2,6 +2,7 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+#include "qm_db/recordfacts.h"
 #include "qm_rps/desk/recordnames.h"
 #include "qm_rps/pushovercalculators.h"
 
@@ -9,7 +10,7 @@ using zql::lib::MMSGFunction;
 
 std::vector<std::string> CPushOverComparisonDlg::LoadCases() const
 {
-    return NamesOf(m_doc.Data().Model().pushovers);
+    return PushNames(m_doc.Data().Model());
 }
 
 std::vector<std::string> CPushOverComparisonDlg::Spectra() const

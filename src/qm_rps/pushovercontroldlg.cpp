@@ -31,9 +31,9 @@ void CPushOverControlDlg::Dlg2Data(T_EVAL_D& evaluation) const
 
 std::string CPushOverControlDlg::ControlText() const
 {
-    int key = 0;
     T_POLC_D polc;
-    if (!m_doc.Attr().FindPolc(m_read.push, key) || !m_doc.Attr().GetPolc(key, polc)) return {};
+    const auto push = FindPush(m_doc.Data().Model(), m_read.push);
+    if (!push || !m_doc.Attr().GetPolc(push->key, polc)) return {};
     return polc.controlOption == kNamedControlNode
                ? MMSGFunction::Format("IDS_QM_UI_PUSH_CONTROL_NAMED",
                                       {std::to_string(polc.controlNode)})

@@ -207,7 +207,7 @@ std::string CPushOverCurveEdit::StoredStepsText() const
 {
     int key = 0;
     std::array<int, 3> s{};
-    if (!m_doc.Attr().FindPolc(m_settings.push, key)) return {};
+    if (!m_doc.Attr().FindPolc(m_settings.push, key)) return {}; // of a direction none are kept
     const auto step = [](int number) {
         return number >= 0 ? std::to_string(number) : std::string("-");
     };

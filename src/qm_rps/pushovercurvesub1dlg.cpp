@@ -9,7 +9,7 @@ using zql::lib::MMSGFunction;
 
 std::vector<std::string> CPushOverCurveSub1Dlg::LoadCases() const
 {
-    return NamesOf(m_doc.Data().Model().pushovers);
+    return PushNames(m_doc.Data().Model());
 }
 
 std::vector<std::string> CPushOverCurveSub1Dlg::Methods()

@@ -1,5 +1,7 @@
 #include "qm_rps/ssreportinforw.h"
 
+#include "qm_db/recordfacts.h"
+#include "qm_rps/evaluatedsteps.h"
 #include "qm_rps/pushovercalculators.h"
 
 namespace {
@@ -30,7 +32,7 @@ void AddStoreys(CDBDoc& doc, SSReportInfoRW& out)
 }
 
 /// False: the results can't be read.
-bool ReadStep(CDBDoc& doc, T_REPORT_PUSH& push, int step)
+bool ReadStep(CDBDoc& doc, T_REPORT_PUSH& push, int turn, int step)
 {
     CPostCtrl& post = doc.Post();
     T_REPORT_STEP row;
@@ -40,7 +42,7 @@ bool ReadStep(CDBDoc& doc, T_REPORT_PUSH& push, int step)
         !post.GetDispNew(push.controlNode, row.controlDisplacement))
         return false;
     if (!doc.Data().Model().storeys.empty())
-        (void)post.GetPushoverStoryDrifts(push.key, step, row.drifts); // none: stays empty
+        (void)post.GetPushoverStoryDrifts(push.key, step, row.drifts, turn); // none: stays empty
     push.steps.push_back(std::move(row));
     return true;
 }
@@ -57,22 +59,41 @@ void AddLimitStates(CDBDoc& doc, T_REPORT_PUSH& push)
     add(info.GetStepNTC2008(push.key, steps), kNtcNames);
 }
 
-int AddPushovers(CDBDoc& doc, SSReportInfoRW& out, std::string& error)
+/// The load case as it stands, or one of the directions of its static angle.
+int AddPushover(CDBDoc& doc, const T_POLC_D& record, T_PUSH_NAME id, SSReportInfoRW& out,
+                std::string& error)
 {
     CPostCtrl& post = doc.Post();
+    const std::string name =
+        id.turn == 0 ? record.name : TurnedNames(record)[static_cast<std::size_t>(id.turn - 1)];
+    T_REPORT_PUSH push{id.key,
+                       name,
+                       record.controlNode,
+                       record.direction,
+                       {},
+                       {},
+                       PushEndedOf(doc, id.key, id.turn),
+                       {}};
+    (void)post.IsStale(id.key, push.old, id.turn);
+    const int steps = post.SelectPushover(id.key, id.turn) ? post.GetStepCount() : 0;
+    for (int step = 1; step <= steps; ++step) {
+        if (ReadStep(doc, push, id.turn, step)) continue;
+        error = "pushover load case \"" + name + "\", step " + std::to_string(step) + ": " +
+                (post.Error().empty() ? "no results" : post.Error());
+        return 0;
+    }
+    if (id.turn == 0) AddLimitStates(doc, push);
+    out.pushovers.push_back(std::move(push));
+    return 1;
+}
+
+int AddPushovers(CDBDoc& doc, SSReportInfoRW& out, std::string& error)
+{
     for (const auto& [key, record] : doc.Data().Model().pushovers) {
-        T_REPORT_PUSH push{key, record.name, record.controlNode,    record.direction,
-                           {},  {},          PushEndedOf(doc, key), {}};
-        (void)post.IsStale(key, push.old);
-        const int steps = post.SelectPushover(key) ? post.GetStepCount() : 0;
-        for (int step = 1; step <= steps; ++step) {
-            if (ReadStep(doc, push, step)) continue;
-            error = "pushover load case \"" + record.name + "\", step " + std::to_string(step) +
-                    ": " + (post.Error().empty() ? "no results" : post.Error());
-            return 0;
-        }
-        AddLimitStates(doc, push);
-        out.pushovers.push_back(std::move(push));
+        const int last =
+            doc.Post().SelectPushover(key) ? 0 : static_cast<int>(std::ssize(TurnedNames(record)));
+        for (int turn = last > 0 ? 1 : 0; turn <= last; ++turn)
+            if (!AddPushover(doc, record, {key, turn}, out, error)) return 0;
     }
     return 1;
 }
@@ -82,9 +103,7 @@ int AddEvaluations(CDBDoc& doc, SSReportInfoRW& out, std::string& error)
     CPushEvaluator driver(doc, RunPerfPtProcedure);
     T_FINDING refusal;
     driver.SetStoreSteps(false); // a report changes nothing
-    for (const auto& entry : doc.Data().Model().evaluations) {
-        T_EVAL_D eval;
-        if (!doc.Attr().GetEval(entry.first, eval)) continue;
+    for (const T_EVAL_D& eval : EvaluationsOf(doc)) {
         if (!driver.SetEvaluation(eval, refusal)) {
             error = "evaluation \"" + eval.name + "\": " + refusal.text;
             return 0;

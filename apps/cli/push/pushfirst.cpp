@@ -4,6 +4,7 @@
 #include "output.h"
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
+#include "qm_db/recordfacts.h"
 
 #include <cstdio>
 #include <unistd.h>
@@ -64,13 +65,13 @@ EXIT_CODE PushWhereMissing(CDBDoc& doc, const std::string& file, const std::set<
     std::vector<int> missing;
     for (const int key : keys) {
         const auto record = doc.Data().Model().pushovers.find(key);
-        if (record == doc.Data().Model().pushovers.end() || !record->second.control ||
-            record->second.control->generateStaticAngle)
-            continue;
+        if (record == doc.Data().Model().pushovers.end() || !record->second.control) continue;
         std::string why;
-        if (!doc.Data().Content().results.contains(key))
+        const int turn =
+            doc.Post().SelectPushover(key) || TurnedNames(record->second).empty() ? 0 : 1;
+        if (!doc.Post().SelectPushover(key, turn))
             why = Say("IDS_QM_CLI_PUSHING_FIRST", record->second.name);
-        else if (doc.Post().IsStale(key, why))
+        else if (doc.Post().IsStale(key, why, turn))
             why += " " + Say("IDS_QM_CLI_PUSHING_AGAIN");
         else
             continue;

@@ -1,6 +1,7 @@
 #include "qm_db/casefile/casereader.h"
 #include "qm_db/casefile/jsonnames.h"
 #include "qm_db/records/evaluationrules.h"
+#include "qm_db/records/pushnames.h"
 
 #include <algorithm>
 
@@ -23,7 +24,7 @@ void Judge(CJsonReader& in, std::string_view key, const T_EVAL_D& eval)
 
 void JudgeEvaluation(CJsonReader& in, const T_MODEL& model, const T_EVAL_D& eval)
 {
-    if (!HasName(model.pushovers, eval.push))
+    if (!FindPush(model, eval.push))
         in.FailAt("push", "IDS_QM_CASE_NO_PUSHOVER", QuotedText(eval.push));
     if (!HasName(model.spectra, eval.spectrum))
         in.FailAt("spectrum", "IDS_QM_CASE_NO_SPECTRUM", QuotedText(eval.spectrum));

@@ -1,6 +1,7 @@
 #include "qm_db/records/evaluationrules.h"
 
 #include "qm_base/msgfunction.h"
+#include "qm_db/records/pushnames.h"
 #include "qm_db/records/rulehead.h"
 
 #include <algorithm>
@@ -127,7 +128,7 @@ struct T_REFERENCES {
 };
 constexpr T_RECORD_RULE<T_REFERENCES> kReferences[] = {
     {{.message = "IDS_QM_UI_PUSH_NO_CASE", .field = "push"},
-     [](const T_REFERENCES& r) { return HasName(r.model.pushovers, r.evaluation.push); }},
+     [](const T_REFERENCES& r) { return FindPush(r.model, r.evaluation.push).has_value(); }},
     {{.message = "IDS_QM_UI_PUSH_NO_SPECTRUM", .field = "spectrum"},
      [](const T_REFERENCES& r) { return HasName(r.model.spectra, r.evaluation.spectrum); }},
     {{.message = "IDS_QM_EVAL_NO_NODE", .field = "monitoredNodes"},

@@ -4,6 +4,7 @@
 #include "qm_db/records/casenames.h"
 #include "qm_db/records/hingefields.h"
 #include "qm_db/records/pushfields.h"
+#include "qm_db/records/pushnames.h"
 #include "qm_db/records/stagefields.h"
 
 #include <algorithm>
@@ -24,7 +25,8 @@ public:
     void Reference(RECORD_KIND kind, int key) { m_found |= kind == m_kind && key == m_key; }
     void Reference(RECORD_KIND kind, const std::string& name)
     {
-        m_found |= kind == m_kind && name == m_name;
+        const bool turned = kind == KindOf<T_POLC_D>() && IsTurnOf(name, m_name);
+        m_found |= kind == m_kind && (name == m_name || turned);
     }
     bool IsFound() const { return m_found; }
 

@@ -1,7 +1,6 @@
 #include "qm_rps/push/pushcases.h"
 
 #include "qm_base/say.h"
-#include "qm_base/textformat.h"
 #include "qm_rps/push/loadalgebra.h"
 
 #include <algorithm>
@@ -153,7 +152,7 @@ int Turn(const CAnalysisModel& frame, double step, int times, T_PUSH_CASE& c, st
     stage.along = c.along;
     stage.loads = TurnedAboutZ(stage.loads, frame.Frame(), angle);
     c.angle = angle;
-    c.name += "@" + FormatText("%g", angle);
+    c.name = TurnedName(c.name, angle);
     for (const std::size_t d : {0U, 1U})
         if (c.along[d] != 0.0 && frame.Frame().nodes[c.controlNode].fixed[d])
             return Fail(error,

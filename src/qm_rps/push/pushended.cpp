@@ -2,8 +2,26 @@
 
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
+#include "qm_db/recordfacts.h"
 #include "qm_rps/push/pushcases.h"
 #include "qm_rps/push/pushquantity.h"
+
+namespace {
+
+/// Displacement of the control at the last step (SI), along the direction of a turned push.
+double LastDisplacement(IPushRun& run, int controlNode)
+{
+    std::vector<T_RUN_STEP> steps;
+    std::vector<T_DOF6> moved;
+    if (!run.ReadSteps(steps) || steps.empty()) return run.Head().end.displacement;
+    if (run.Head().turn == 0 || !run.ReadNode(controlNode, moved)) return steps.back().displacement;
+    double along = 0.0;
+    for (std::size_t d = 0; d < 6; ++d)
+        along += run.Head().control[d] * moved.back()[d];
+    return along;
+}
+
+} // namespace
 
 std::optional<T_PUSH_ENDED> PushEndedOf(CDBDoc& doc, int key, int turn)
 {
@@ -20,18 +38,16 @@ std::optional<T_PUSH_ENDED> PushEndedOf(CDBDoc& doc, int key, int turn)
     if (out.earlier) out.status = PUSH_STATUS::Failed;
     const T_PUSH_QUANTITY length =
         DisplacementIn(static_cast<std::size_t>(record->second.direction - 1), doc.Unit().Units());
-    std::vector<T_RUN_STEP> steps;
-    const bool any = run->ReadSteps(steps) && !steps.empty();
-    out.displacement = length.Shown(any ? steps.back().displacement : end.displacement);
+    out.displacement = length.Shown(LastDisplacement(*run, record->second.controlNode));
     out.unit = length.Unit();
     return out;
 }
 
 std::optional<zql::frx::T_MESSAGE> PushRemark(CDBDoc& doc, const std::string& push)
 {
-    int key = 0;
-    if (!doc.Attr().FindPolc(push, key)) return std::nullopt;
-    const std::optional<T_PUSH_ENDED> ended = PushEndedOf(doc, key);
+    const std::optional<T_PUSH_NAME> name = FindPush(doc.Data().Model(), push);
+    if (!name) return std::nullopt;
+    const std::optional<T_PUSH_ENDED> ended = PushEndedOf(doc, name->key, name->turn);
     if (!ended || ended->status != PUSH_STATUS::Failed) return std::nullopt;
     const char* const text = ended->outcome == solver::PUSH_OUTCOME::Cancelled
                                  ? "IDS_QM_PUSH_CUT_CANCELLED"

@@ -1,7 +1,7 @@
 #include "qm_rps/push/pushresultlist.h"
 
 #include "qm_base/say.h"
-#include "qm_base/textformat.h"
+#include "qm_db/recordfacts.h"
 
 #include <algorithm>
 #include <cmath>
@@ -14,9 +14,9 @@ std::vector<T_PUSH_RESULT_ID> PushResultsOf(CDBDoc& doc)
         const auto record = model.pushovers.find(key);
         if (record == model.pushovers.end() || !result.Run()) return;
         const T_RUN_HEAD& head = result.Run()->Head();
-        out.push_back({key, turn,
-                       record->second.name +
-                           (turn > 0 ? "@" + FormatText("%g", head.angle) : std::string())});
+        out.push_back(
+            {key, turn,
+             turn > 0 ? TurnedName(record->second.name, head.angle) : record->second.name});
     };
     for (const auto& [key, result] : doc.Data().Content().results)
         if (result) add(key, 0, *result);

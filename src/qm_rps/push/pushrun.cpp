@@ -202,8 +202,8 @@ int CPushRun::Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_
                                        !StoreysOf(m_model, m_frame, 0).empty(), on->hinges.laws);
     std::vector<T_PUSH_RUN> runs;
     for (T_PUSH_CASE& c : cases) {
-        std::vector<double>& additional = c.stages.back().additional;
-        additional.insert(additional.end(), extra.begin(), extra.end());
+        std::vector<double>& steps = c.stages.back().additional;
+        steps.insert(steps.end(), extra.begin(), extra.end());
         c.evaluated = extra;
         if (!RunCase(*on, c, progress, runs.emplace_back(), error)) {
             error = Say("IDS_QM_PUSH_CASE_QUOTED", m_model.pushovers.at(key).name) + ": " + error;

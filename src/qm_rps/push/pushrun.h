@@ -73,7 +73,7 @@ public:
     /// All results of a load case; with a static angle several. 1 done, however they ended; 0
     /// `error` says what is wrong with model, hinges or load case, `out` unchanged.
     /// extra: displacements of the control node (m) at what evaluations find, steps too, beside
-    /// those of the record; evaluations do not read them.
+    /// those of the record; evaluations do not read them. Between the axes they are left out.
     [[nodiscard]] int Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_RUN>& out,
                           std::string& error, const std::vector<double>& extra = {});
 

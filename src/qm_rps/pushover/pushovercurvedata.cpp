@@ -1,10 +1,12 @@
 #include "qm_rps/pushover/pushovercurvedata.h"
 
 #include "qm_base/msgfunction.h"
+#include "qm_db/recordfacts.h"
 #include "qm_db/storyload.h"
 
 #include <algorithm>
 #include <cmath>
+#include <numeric>
 
 using zql::lib::MMSGFunction;
 
@@ -25,16 +27,64 @@ int CPushOverCurveData::Calc(const T_PUSH_CURVE_SETTINGS& settings)
     return PreparePOCurveData();
 }
 
-double CPushOverCurveData::DirectionMass(int direction) const
+/// The direction of control: an axis, of a turned push what its loads were turned to.
+void CPushOverCurveData::FindDirection()
 {
-    return direction < 3 ? m_mass[static_cast<std::size_t>(direction)] : 0.0;
+    m_along = {};
+    m_factors.oblique = false;
+    const IPushRun* const run =
+        m_settings.turn > 0 ? m_doc.Post().RunOf(m_settings.pushover, m_settings.turn) : nullptr;
+    if (!IsRotation() && !run) m_along[static_cast<std::size_t>(Direction())] = 1.0;
+    if (IsRotation() || !run) return;
+    m_polc.name = TurnedName(m_polc.name, run->Head().angle);
+    std::copy_n(run->Head().control.begin(), 3, m_along.begin());
+    const auto largest =
+        std::ranges::max_element(m_along, {}, [](double c) { return std::fabs(c); });
+    m_polc.direction = static_cast<int>(largest - m_along.begin()) + 1;
+    m_factors.oblique = std::fabs(*largest) != 1.0;
+}
+
+double CPushOverCurveData::Along(const std::array<double, 3>& v) const
+{
+    return std::inner_product(v.begin(), v.end(), m_along.begin(), 0.0);
+}
+
+/// Of a direction between the axes: of each axis the share of its mass (e . M e).
+double CPushOverCurveData::MassAlong(const std::array<double, 3>& mass) const
+{
+    double sum = 0.0;
+    for (std::size_t d = 0; d < 3; ++d)
+        sum += m_along[d] * m_along[d] * mass[d];
+    return sum;
+}
+
+/// Participation along the direction: that of the axes adds up as their ground motion does.
+double CPushOverCurveData::ModalFactor(const T_MPAF_D& factor) const
+{
+    if (IsRotation()) return factor.factor[static_cast<std::size_t>(Direction())];
+    return Along({factor.factor[0], factor.factor[1], factor.factor[2]});
+}
+
+/// Effective mass along the direction, per cent: factor squared times the modal mass, which each
+/// axis tells (mass times percent / factor squared); here the one with the largest factor.
+double CPushOverCurveData::ModalPercent(const T_MPAF_D& factor, const T_MPAM_D& percent) const
+{
+    if (!m_factors.oblique) return percent.percent[static_cast<std::size_t>(Direction())];
+    const auto first = factor.factor.begin();
+    const auto largest =
+        std::max_element(first, first + 3, [](double a, double b) { return a * a < b * b; });
+    const auto d = static_cast<std::size_t>(largest - first);
+    const double total = MassAlong(m_mass), along = ModalFactor(factor);
+    if (*largest == 0.0 || total == 0.0) return 0.0;
+    return percent.percent[d] * m_mass[d] / (*largest * *largest) * along * along / total;
 }
 
 double CPushOverCurveData::ControlShape() const
 {
     T_DOF6 shape;
     m_doc.Post().GetEiMode(m_polc.controlNode, shape);
-    return shape[static_cast<std::size_t>(Direction())];
+    if (IsRotation()) return shape[static_cast<std::size_t>(Direction())];
+    return Along({shape[0], shape[1], shape[2]});
 }
 
 int CPushOverCurveData::BeforePreparePOCurveData(const T_PUSH_CURVE_SETTINGS& settings)
@@ -50,6 +100,7 @@ int CPushOverCurveData::BeforePreparePOCurveData(const T_PUSH_CURVE_SETTINGS& se
         m_error = MMSGFunction::GetValue("IDS_QM_CURVE_NO_CASE");
         return 0;
     }
+    FindDirection();
     if (IsControlNodeFound() && !FindControlNode()) return 0;
     if (m_polc.direction == kDirectionZ) m_plotType = PLOT_TYPE::LoadFactor;
     if (m_polc.patternKind == kUniformAcceleration && IsTargetType(m_plotType))
@@ -68,7 +119,7 @@ int CPushOverCurveData::BeforePreparePOCurveData(const T_PUSH_CURVE_SETTINGS& se
     const bool massBased = IsSpectral(m_plotType) && !m_factors.eigenBased && control != 0.0;
     CalcMassFactors(massBased ? control : 0.0);
     if (IsSpectral(m_plotType) && !m_factors.eigenBased) CheckStoreyMasses();
-    const double total = DirectionMass(Direction());
+    const double total = MassAlong(m_mass);
     m_massError = !(std::fabs(total) > kNoMass) || !massBased;
     m_factors.mass = total;
     m_factors.weight = m_mass[2] * settings.gravity;
@@ -79,7 +130,8 @@ int CPushOverCurveData::BeforePreparePOCurveData(const T_PUSH_CURVE_SETTINGS& se
 int CPushOverCurveData::FindControlNode()
 {
     CPostCtrl& post = m_doc.Post();
-    if (post.SelectPushover(m_settings.pushover) && post.FindControlNode(m_polc.controlNode))
+    if (post.SelectPushover(m_settings.pushover, m_settings.turn) &&
+        post.FindControlNode(m_polc.controlNode))
         return 1;
     m_error =
         post.Error().empty() ? MMSGFunction::GetValue("IDS_QM_CURVE_NO_RESULTS") : post.Error();
@@ -91,12 +143,11 @@ int CPushOverCurveData::FindControlNode()
 void CPushOverCurveData::CalcEigenMode()
 {
     m_eigenError = false;
-    const auto d = static_cast<std::size_t>(Direction());
     CPostCtrl& post = m_doc.Post();
     m_noEigen = post.GetNumEigvPost() == 0;
     const auto factorOf = [&](int mode) {
         T_MPAF_D factor;
-        return post.GetEiMpafNeutral(mode, factor) ? std::fabs(factor.factor[d]) : 0.0;
+        return post.GetEiMpafNeutral(mode, factor) ? std::fabs(ModalFactor(factor)) : 0.0;
     };
     int chosen = 1;
     if (m_polc.patternKind == kModeShape || m_polc.patternKind == kModeShapeStoreyMass) {
@@ -124,21 +175,21 @@ void CPushOverCurveData::CalcEigenMode()
 // Gamma = S1 / S2, alpha = S1^2 / (M S2), the shape being 1 at the control node.
 void CPushOverCurveData::CalcMassFactors(double control)
 {
-    const auto d = static_cast<std::size_t>(std::min(Direction(), 2));
     const bool uniform = m_polc.patternKind == kUniformAcceleration;
     double S1 = 0.0, S2 = 0.0, terms = 0.0;
     for (const T_NODAL_MASS& nodal : CStoryLoad(m_doc.Data()).Calc_Nodal_Mass()) {
         for (std::size_t k = 0; k < 3; ++k)
             m_mass[k] += nodal.mass[k];
-        if (control == 0.0 || Direction() > 2) continue;
+        if (control == 0.0 || IsRotation()) continue;
         T_DOF6 shape;
         m_doc.Post().GetEiMode(nodal.node, shape);
-        const double phi = uniform ? 1.0 : shape[d] / control;
-        S1 += phi * nodal.mass[d];
-        terms += std::fabs(phi * nodal.mass[d]);
-        S2 += phi * phi * nodal.mass[d];
+        const double phi = uniform ? 1.0 : Along({shape[0], shape[1], shape[2]}) / control;
+        const double mass = MassAlong(nodal.mass);
+        S1 += phi * mass;
+        terms += std::fabs(phi * mass);
+        S2 += phi * phi * mass;
     }
-    const double total = DirectionMass(Direction());
+    const double total = MassAlong(m_mass);
     if (S2 == 0.0 || total == 0.0) return;
     if (std::fabs(S1) <= kNoParticipation * terms) return; // what is left is rounding
     m_massGamma = S1 / S2;
@@ -147,15 +198,17 @@ void CPushOverCurveData::CalcMassFactors(double control)
 
 void CPushOverCurveData::CheckStoreyMasses()
 {
-    if (Direction() > 2) return;
+    if (IsRotation()) return;
     const T_MODEL& model = m_doc.Data().Model();
     for (const auto& entry : model.storeys) {
         double mass = 0.0;
         for (const int id : entry.second.nodes) {
             const auto node = model.nodes.find(id);
-            const auto d = static_cast<std::size_t>(Direction());
-            if (node != model.nodes.end() && !node->second.restraint[d])
-                mass += node->second.mass[d];
+            if (node == model.nodes.end()) continue;
+            std::array<double, 3> free = node->second.mass;
+            for (std::size_t d = 0; d < 3; ++d)
+                if (node->second.restraint[d]) free[d] = 0.0;
+            mass += MassAlong(free);
         }
         if (!(mass > 0.0)) m_storeyWithoutMass = true;
     }
@@ -164,14 +217,13 @@ void CPushOverCurveData::CheckStoreyMasses()
 void CPushOverCurveData::CalcConversion()
 {
     if (!IsSpectral(m_plotType)) return;
-    const auto d = static_cast<std::size_t>(Direction());
     if (m_factors.eigenBased) {
         T_MPAF_D factor;
         T_MPAM_D percent;
         if (m_factors.mode > 0 && m_doc.Post().GetEiMpafNeutral(m_factors.mode, factor) &&
             m_doc.Post().GetEiMpam(m_factors.mode, percent)) {
-            m_factors.gamma = std::fabs(ControlShape() * factor.factor[d]);
-            if (m_factors.gamma != 0.0) m_factors.alpha = percent.percent[d] / 100.0;
+            m_factors.gamma = std::fabs(ControlShape() * ModalFactor(factor));
+            if (m_factors.gamma != 0.0) m_factors.alpha = ModalPercent(factor, percent) / 100.0;
         }
     } else {
         m_factors.gamma = m_massGamma; // keeps its sign, on purpose
@@ -227,7 +279,7 @@ int CPushOverCurveData::PreparePOCurveData()
     m_decreasingStep = 0;
     m_extra.fill({0.0});
     CPostCtrl& post = m_doc.Post();
-    if (!post.SelectPushover(m_settings.pushover)) {
+    if (!post.SelectPushover(m_settings.pushover, m_settings.turn)) {
         m_error = MMSGFunction::GetValue("IDS_QM_CURVE_NO_RESULTS");
         return 0;
     }

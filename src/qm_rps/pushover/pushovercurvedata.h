@@ -34,6 +34,7 @@ inline bool IsTargetType(PLOT_TYPE type)
 
 struct T_PUSH_CURVE_SETTINGS {
     int pushover = 0; // key of the load case
+    int turn = 0;     // of its static angle: so many times
     PLOT_TYPE plotType = PLOT_TYPE::Atc40;
     bool eigenFactors = true; // factors of the eigen mode, else from nodal masses and the shape
     double gravity = 9.80665; // current units
@@ -53,7 +54,8 @@ struct T_PUSH_FACTORS {
     double weight = 0.0;  // vertical mass times gravity, else the user's weight
     double gravity = 0.0; // length / s2
     bool eigenBased = true;
-    int mode = 0; // eigen mode used; 0 none
+    int mode = 0;         // eigen mode used; 0 none
+    bool oblique = false; // the direction lies between the axes
     bool operator==(const T_PUSH_FACTORS&) const = default;
 };
 inline auto Numbers(const T_PUSH_FACTORS& f)
@@ -110,15 +112,21 @@ private:
     int PreparePOCurveData();
     int AppendStep(int step);
     double ControlShape() const;
-    int Direction() const { return m_polc.direction - 1; } // 0 to 5
-    double DirectionMass(int direction) const;
+    int Direction() const { return m_polc.direction - 1; } // 0 to 5; the nearest axis
+    bool IsRotation() const { return Direction() > 2; }
+    void FindDirection();
+    double Along(const std::array<double, 3>& v) const;
+    double MassAlong(const std::array<double, 3>& mass) const;
+    double ModalFactor(const T_MPAF_D& factor) const;
+    double ModalPercent(const T_MPAF_D& factor, const T_MPAM_D& percent) const;
 
     CDBDoc& m_doc;
     T_PUSH_CURVE_SETTINGS m_settings;
     T_POLC_D m_polc;
     PLOT_TYPE m_plotType = PLOT_TYPE::Atc40;
     T_PUSH_FACTORS m_factors;
-    std::array<double, 3> m_mass{}; // second per-direction totals
+    std::array<double, 3> m_along{}; // unit vector of a translation
+    std::array<double, 3> m_mass{};  // second per-direction totals
     double m_massGamma = 0.0, m_massAlpha = 0.0;
     bool m_noEigen = false, m_eigenError = false, m_conversionError = false, m_massError = false;
     bool m_storeyWithoutMass = false;

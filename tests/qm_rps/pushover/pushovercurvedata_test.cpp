@@ -103,6 +103,44 @@ TEST_F(CurveData, RecordedParticipationIsUsedAsItStands)
     EXPECT_DOUBLE_EQ(0.8, m_curve.Factors().alpha);
 }
 
+// Pushed along (0.6, 0.8): masses 0.36 mx + 0.64 my = 1.04, 1.04, 0.68, together 2.76. Mode 1 (Y):
+// L = 3, M = 7; mode 2 (X): L = 9, M = 19, of which the direction has 0.8 and 0.6. From the masses
+// with the shape 1/3, 2/3, 1: S1 = 1.72, S2 = 1.04 * 5/9 + 0.68.
+TEST_F(CurveData, BetweenTheAxesTakesOfEachItsShare)
+{
+    T_RUN_DATA run;
+    run.head.turn = 1;
+    run.head.angle = 53.13;
+    run.head.control = {0.6, 0.8};
+    run.nodes = {3};
+    run.steps.resize(1);
+    run.steps[0].baseReaction = 20e3;
+    run.displacement = {{{0.06, 0.08}}};
+    m_content.turnedResults[{1, 1}] = MakePushRun(run);
+    const double S2 = 1.04 * 5.0 / 9.0 + 0.68;
+    const struct {
+        int pattern;
+        bool eigen;
+        double gamma, alpha;
+    } kRows[] = {{0, true, 0.64 * 9.0 / 7.0, 0.64 * 9.0 / 7.0 / 2.76}, // the larger factor
+                 {2, true, 0.36 * 27.0 / 19.0, 0.36 * 81.0 / 19.0 / 2.76},
+                 {2, false, 1.72 / S2, 1.72 * 1.72 / S2 / 2.76}};
+    m_push.modes = {2};
+    for (const auto& row : kRows) {
+        m_push.patternKind = row.pattern;
+        T_PUSH_CURVE_SETTINGS settings = Settings(P::Atc40, row.eigen);
+        settings.turn = 1;
+        ASSERT_EQ(1, Calc(settings)) << m_curve.Error();
+        EXPECT_NEAR(2.76, m_curve.Factors().mass, 1e-12);
+        EXPECT_NEAR(row.gamma, m_curve.Factors().gamma, 1e-12);
+        EXPECT_NEAR(row.alpha, m_curve.Factors().alpha, 1e-12);
+        EXPECT_NEAR(0.1 / row.gamma, m_curve.Displacement()[1], 1e-12);
+        EXPECT_NEAR(20.0 / (2.76 * 10.0 * row.alpha), m_curve.Force()[1], 1e-12);
+        EXPECT_EQ("PX@53.13", m_curve.LoadCase().name);
+        EXPECT_EQ(2, m_curve.LoadCase().direction);
+    }
+}
+
 // Shape -2, -1, 1 in X: S1 = -4 - 2 + 1, S2 = 8 + 2 + 1; the curve itself stays positive.
 TEST_F(CurveData, MassBasedGammaKeepsItsSignAndAVanishingOneIsAnError)
 {

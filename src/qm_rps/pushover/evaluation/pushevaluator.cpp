@@ -39,10 +39,15 @@ CPushEvaluator::CPushEvaluator(CDBDoc& doc, PERFPT_PROCEDURE procedure)
 
 int CPushEvaluator::SetEvaluation(const T_EVAL_D& evaluation, T_FINDING& refusal)
 {
-    int pushover = 0, spectrum = 0;
+    int spectrum = 0;
     T_SPFC_D record;
-    if (!m_doc.Attr().FindPolc(evaluation.push, pushover))
-        return Refuse(refusal, "push", "IDS_QM_PUSH_CASE_UNKNOWN", {evaluation.push});
+    const std::optional<T_PUSH_NAME> push = FindPush(m_doc.Data().Model(), evaluation.push);
+    if (!push) return Refuse(refusal, "push", "IDS_QM_PUSH_CASE_UNKNOWN", {evaluation.push});
+    const std::vector<std::string> directions =
+        TurnedNames(m_doc.Data().Model().pushovers.at(push->key));
+    if (push->turn == 0 && !directions.empty() && !m_doc.Post().SelectPushover(push->key))
+        return Refuse(refusal, "push", "IDS_QM_PUSH_MANY_DIRECTIONS",
+                      {evaluation.push, directions.front(), directions.back()});
     if (!m_doc.Attr().FindSpfc(evaluation.spectrum, spectrum) ||
         !m_doc.Attr().GetSpfc(spectrum, record))
         return Refuse(refusal, "spectrum", "IDS_QM_PUSH_SPECTRUM_UNKNOWN", {evaluation.spectrum});
@@ -55,7 +60,7 @@ int CPushEvaluator::SetEvaluation(const T_EVAL_D& evaluation, T_FINDING& refusal
     m_masonryGiven = evaluation.masonry.has_value();
     m_eval.masonry = evaluation.masonry.value_or(ExistEC8OrMasonry());
     m_spectrumRecord = record;
-    m_pushover = pushover;
+    m_push = *push;
     SetDamping(DampingOf(evaluation));
     SetAlphaInPercent(evaluation.alphaInPercent.value_or(false));
     return 1;
@@ -85,7 +90,8 @@ int CPushEvaluator::Fail(PUSH_OUTCOME code, const char* key)
 T_PUSH_CURVE_SETTINGS CPushEvaluator::CurveSettings(PLOT_TYPE type) const
 {
     T_PUSH_CURVE_SETTINGS settings;
-    settings.pushover = m_pushover;
+    settings.pushover = m_push.key;
+    settings.turn = m_push.turn;
     settings.plotType = type;
     settings.eigenFactors = m_eval.eigenFactors.value_or(true);
     settings.gravity = FindGravity(true);
@@ -143,7 +149,7 @@ int CPushEvaluator::IsUsable()
 
 void CPushEvaluator::WarnAboutCurve()
 {
-    if (std::string why; m_doc.Post().IsStale(m_pushover, why))
+    if (std::string why; m_doc.Post().IsStale(m_push.key, why, m_push.turn))
         m_result.messages.push_back({kResultsAreOld, why});
     if (auto remark = PushRemark(m_doc, m_eval.push))
         m_result.messages.push_back(std::move(*remark));
@@ -251,7 +257,7 @@ T_TARGET_INPUT CPushEvaluator::TargetInput(CStepDrift& drift) const
 int CPushEvaluator::UpdateTargetDispData()
 {
     const char* const failed = "IDS_RPS_FAILED_FINDING_TARGET_DISPLACEMENT";
-    CStepDrift drift(m_doc, m_pushover, m_eval.driftKind.value_or(1));
+    CStepDrift drift(m_doc, m_push, m_eval.driftKind.value_or(1));
     T_TARGET_INPUT input = TargetInput(drift);
     const bool enabled = std::ranges::any_of(
         input.spectra, [](const T_TARGET_SPECTRUM& s) { return static_cast<bool>(s.SaAt); });
@@ -277,7 +283,7 @@ int CPushEvaluator::UpdateTargetDispData()
     }
     m_result.guideLines = evaluation.GuideLines();
     m_result.outcome = evaluation.Outcome();
-    if (!m_storeSteps) return found;
+    if (!m_storeSteps || m_push.turn != 0) return found; // they are of a load case
     std::vector<int> demands;
     for (std::optional<int> step : evaluation.DemandSteps()) {
         TakeStepNumber(step);
@@ -297,19 +303,19 @@ void CPushEvaluator::StoreSteps(const std::vector<int>& steps)
 {
     CPoverInfo* info = m_doc.Post().GetPoverInfo();
     if (m_eval.method == PUSH_METHOD::Ec8Opcm)
-        info->SetStepEC8(m_pushover, steps[0], steps[1], steps[2]);
+        info->SetStepEC8(m_push.key, steps[0], steps[1], steps[2]);
     else // SLO is shown but never stored, on purpose
-        info->SetStepNTC2008(m_pushover, steps[1], steps[2], steps[3]);
+        info->SetStepNTC2008(m_push.key, steps[1], steps[2], steps[3]);
 }
 
 // An evaluation that ended early found none; those of an earlier one don't stand any more.
 void CPushEvaluator::ForgetSteps()
 {
-    if (!m_result.IsTarget() || !m_storeSteps) return;
+    if (!m_result.IsTarget() || !m_storeSteps || m_push.turn != 0) return;
     std::array<int, 3> stored{};
     CPoverInfo* info = m_doc.Post().GetPoverInfo();
-    if (m_eval.method == PUSH_METHOD::Ec8Opcm ? info->GetStepEC8(m_pushover, stored)
-                                              : info->GetStepNTC2008(m_pushover, stored))
+    if (m_eval.method == PUSH_METHOD::Ec8Opcm ? info->GetStepEC8(m_push.key, stored)
+                                              : info->GetStepNTC2008(m_push.key, stored))
         StoreSteps(std::vector<int>(m_result.limitStates.size(), kStepNone));
 }
 

@@ -101,7 +101,7 @@ private:
     T_EVAL_D m_eval;
     bool m_masonryGiven = false; // by the evaluation itself
     T_SPFC_D m_spectrumRecord;
-    int m_pushover = 0;
+    T_PUSH_NAME m_push; // load case, and which of its directions
     bool m_storeSteps = true;
     bool m_findAllPoints = true;
     CPushOverCurveData m_curve;

@@ -194,7 +194,7 @@ void CRemarks::OnParticipation()
     T_MPAF_D factor;
     T_MPAM_D percent;
     const auto mode = m_doc.Data().Model().modes.find(f.mode);
-    if (!f.eigenBased || d > 2 || mode == m_doc.Data().Model().modes.end() ||
+    if (!f.eigenBased || f.oblique || d > 2 || mode == m_doc.Data().Model().modes.end() ||
         !m_doc.Post().CalcEiParticipation(f.mode, factor, percent))
         return;
     const auto shape = mode->second.shape.find(m_result.loadCase.controlNode);

@@ -40,7 +40,7 @@ std::optional<double> CStepDrift::Of(int step)
     m_used = true;
     if (step == 0) return 0.0;
     double kind1 = 0.0, kind2 = 0.0;
-    if (!m_doc.Post().GetPushoverStoryDriftRatio(m_pushover, step, kind1, kind2)) {
+    if (!m_doc.Post().GetPushoverStoryDriftRatio(m_push.key, step, kind1, kind2, m_push.turn)) {
         m_missing = true;
         return std::nullopt;
     }
@@ -50,5 +50,6 @@ std::optional<double> CStepDrift::Of(int step)
 const char* CStepDrift::WarningKey()
 {
     if (m_missing) return "IDS_QM_WARN_NO_DRIFT";
-    return m_used && m_doc.Post().HasStoreyGaps(m_pushover) ? "IDS_QM_WARN_STOREY_GAPS" : nullptr;
+    return m_used && m_doc.Post().HasStoreyGaps(m_push.key, m_push.turn) ? "IDS_QM_WARN_STOREY_GAPS"
+                                                                         : nullptr;
 }

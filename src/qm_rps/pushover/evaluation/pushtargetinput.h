@@ -1,6 +1,7 @@
 // What a target-displacement evaluation reads from the model and from its settings.
 #pragma once
 
+#include "qm_db/recordfacts.h"
 #include "qm_rps/pushover/pushovertargetevaluation.h"
 
 /// Options of the bilinear curve: the rule's own, or the method's where none is named, with the
@@ -16,9 +17,7 @@ std::array<T_TARGET_SPECTRUM, 4> TargetSpectraOf(const T_SPFC_D& spectrum, PUSH_
 class CStepDrift {
 public:
     /// kind 1 or 2, see CPostCtrl. The document must outlive this object.
-    CStepDrift(CDBDoc& doc, int pushover, int kind) : m_doc(doc), m_pushover(pushover), m_kind(kind)
-    {
-    }
+    CStepDrift(CDBDoc& doc, T_PUSH_NAME push, int kind) : m_doc(doc), m_push(push), m_kind(kind) {}
 
     /// Ratio of a step; step 0 is the model at rest. Empty: it is not known.
     std::optional<double> Of(int step);
@@ -28,6 +27,7 @@ public:
 
 private:
     CDBDoc& m_doc;
-    int m_pushover, m_kind;
+    T_PUSH_NAME m_push;
+    int m_kind;
     bool m_used = false, m_missing = false;
 };
