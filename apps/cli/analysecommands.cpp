@@ -138,12 +138,11 @@ void PrintShown(const T_ANALYSE_OPTIONS& o, const T_SHOWN& shown, const T_UNITS&
 /// Ids of a list that must be there; each once.
 template <class RECORDS>
 EXIT_CODE ReadIds(const T_ANALYSE_OPTIONS& o, const std::string& text, const RECORDS& records,
-                  const char* missing, std::set<int>& out)
+                  const char* wrong, const char* missing, std::set<int>& out)
 {
     if (text.empty()) return EXIT_CODE::Done;
     const std::optional<std::vector<int>> ids = ParseElementList(text);
-    if (!ids || ids->empty())
-        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_ELEMENT_LIST", text));
+    if (!ids || ids->empty()) return Complain(EXIT_CODE::Usage, Say(wrong, text));
     for (const int id : *ids) {
         if (!records.contains(id))
             return Complain(EXIT_CODE::Usage, o.file + ": " + Say(missing, std::to_string(id)));
@@ -156,11 +155,12 @@ EXIT_CODE ReadChoice(CDBDoc& doc, const T_ANALYSE_OPTIONS& o, T_RESULT_CHOICE& c
 {
     choice.top = static_cast<std::size_t>(o.top);
     const T_MODEL& model = doc.Data().Model();
-    if (const EXIT_CODE code =
-            ReadIds(o, o.nodes, model.nodes, "IDS_QM_ANALYSIS_NO_NODE", choice.nodes);
+    if (const EXIT_CODE code = ReadIds(o, o.nodes, model.nodes, "IDS_QM_CLI_PUSH_NODE_LIST",
+                                       "IDS_QM_ANALYSIS_NO_NODE", choice.nodes);
         code != EXIT_CODE::Done)
         return code;
-    return ReadIds(o, o.elements, model.elements, "IDS_QM_ANALYSIS_NO_ELEMENT", choice.elements);
+    return ReadIds(o, o.elements, model.elements, "IDS_QM_CLI_HINGE_ELEMENT_LIST",
+                   "IDS_QM_ANALYSIS_NO_ELEMENT", choice.elements);
 }
 
 /// Of what is chosen; all of it in ascending order.
