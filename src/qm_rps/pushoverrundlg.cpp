@@ -127,7 +127,7 @@ void CPushOverRunDlg::TakeStep(const T_PUSH_PROGRESS& step)
     if (step.done == 1)
         std::erase_if(m_curves, [&](const T_CURVE& c) { return c.name == step.name; });
     if (m_curves.empty() || m_curves.back().name != step.name)
-        m_curves.push_back({step.name, 0, 0, {}, {}});
+        m_curves.push_back({step.name, 0, 0, {step.startDisplacement}, {step.startReaction}});
     T_CURVE& curve = m_curves.back();
     curve.done = step.done;
     curve.total = step.total;

@@ -18,7 +18,7 @@ public:
         "IDS_QM_UI_PUSH_RUN_STEPS",        "IDS_QM_UI_PUSH_RUN_FACTOR",
         "IDS_QM_UI_PUSH_RUN_DISPLACEMENT", "IDS_QM_UI_PUSH_RUN_REACTION"};
 
-    /// A curve as far as it has come, in SI.
+    /// A curve as far as it has come, in SI, from the state before the first step on.
     struct T_CURVE {
         std::string name;
         std::size_t done = 0, total = 0; // steps

@@ -63,7 +63,11 @@ TEST_F(PushWindows, ALoadCaseIsPushedAndItsResultsAreThoseOfTheDocument)
 {
     const ACT read = [](CDialogWindow& w) {
         EXPECT_TRUE(Says(w, "came to its target"));
-        EXPECT_EQ(108U, Points(w)); // increments to 32.4 in
+        EXPECT_EQ(109U, Points(w)); // the state before the push, increments to 32.4 in
+        const T_PLOT_SERIES& curve = Picture(w).series.front();
+        EXPECT_EQ(0.0, curve.x.front());
+        EXPECT_EQ(0.0, curve.y.front());
+        EXPECT_NEAR(0.3, curve.x[1], 1e-9);
         EXPECT_EQ("reached", Cell(Grid(w, "rows").Model(), 0, 1));
         EXPECT_EQ("108", Cell(Grid(w, "rows").Model(), 0, 2));
         EXPECT_EQ("32.4", Cell(Grid(w, "rows").Model(), 0, 4));

@@ -72,7 +72,10 @@ double CPushCollector::Along(const solver::T_VEC6& v) const
 
 void CPushCollector::Start(const solver::T_PUSH_STEP& step)
 {
-    if (step.stage + 1 == m_case.stages.size()) m_recorder.Start(step);
+    if (step.stage + 1 != m_case.stages.size()) return;
+    m_run.startDisplacement = Along(step.nodes[m_case.controlNode]);
+    m_run.startReaction = 0.0 - Along(step.base);
+    m_recorder.Start(step);
 }
 
 bool CPushCollector::Take(const solver::T_PUSH_STEP& step)

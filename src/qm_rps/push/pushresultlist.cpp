@@ -5,6 +5,38 @@
 
 #include <algorithm>
 #include <cmath>
+#include <numeric>
+
+namespace {
+
+double Along(const T_DOF6& control, const T_DOF6& v)
+{
+    return std::inner_product(control.begin(), control.end(), v.begin(), 0.0);
+}
+
+/// The state before the first step, where the model still names the node that was followed.
+void ReadStart(const T_POLC_D& record, T_PUSH_RUN& run)
+{
+    const T_RUN_DATA& data = run.data;
+    const auto at = std::ranges::lower_bound(data.nodes, record.controlNode);
+    if (data.start.empty() || run.displacement.empty() || at == data.nodes.end() ||
+        *at != record.controlNode)
+        return;
+    const auto node = static_cast<std::size_t>(at - data.nodes.begin());
+    if (Along(data.head.control, data.displacement.front()[node]) != run.displacement.front())
+        return;
+    run.startDisplacement = Along(data.head.control, data.start[node]);
+    run.startReaction = data.head.startReaction;
+}
+
+} // namespace
+
+bool HasImportedSteps(CDBDoc& doc, int key)
+{
+    const T_RESULT_MAP& results = doc.Data().Content().results;
+    const auto it = results.find(key);
+    return it != results.end() && it->second && !it->second->Run();
+}
 
 std::vector<T_PUSH_RESULT_ID> PushResultsOf(CDBDoc& doc)
 {
@@ -51,6 +83,8 @@ int ReadOldRun(CDBDoc& doc, const T_PUSH_RESULT_ID& id, T_PUSH_RUN& out, std::st
         run.baseReaction.push_back(step.baseReaction);
         run.residual.push_back(step.residual);
     }
+    const auto record = doc.Data().Model().pushovers.find(id.key);
+    if (record != doc.Data().Model().pushovers.end()) ReadStart(record->second, run);
     out = std::move(run);
     return 1;
 }

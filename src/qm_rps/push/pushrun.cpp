@@ -143,7 +143,8 @@ int CPushRun::RunCase(T_PREPARED& on, const T_PUSH_CASE& c, const PUSH_PROGRESS_
         if (!collector.Take(step)) return true;
         const T_PUSH_RUN& so = collector.SoFar();
         return !progress || progress({c.name, so.loadFactor.size(), c.stages.back().steps.size(),
-                                      so.displacement.back(), so.baseReaction.back()});
+                                      so.displacement.back(), so.baseReaction.back(),
+                                      so.startDisplacement, so.startReaction.value_or(0.0)});
     };
     sink.start = [&](const solver::T_PUSH_STEP& step) { collector.Start(step); };
     sink.event = [&](const solver::T_PUSH_EVENT& event) { collector.Take(event); };
@@ -305,6 +306,9 @@ int CPushRun::Read(int key, int turn, T_PUSH_RUN& out, std::string& error)
                             end.displacement, hinge, -1},
                            end.storey);
     out.data.steps = std::move(data.steps); // with what evaluations have asked for
+    out.data.head.startReaction = data.head.startReaction;
+    out.startReaction.reset();
+    if (!data.start.empty()) out.startReaction = data.head.startReaction;
     if (!before)
         for (T_PUSH_STOREY_SERIES& storey : out.storeys)
             storey.shear.clear();

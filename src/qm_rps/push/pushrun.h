@@ -45,6 +45,8 @@ struct T_PUSH_RUN {
     std::string outcome, advice;
     std::vector<std::string> warnings; // of a run: stops that could not act
     bool cancelled = false;
+    double startDisplacement = 0.0;      // of the control node, before the first step
+    std::optional<double> startReaction; // then; empty: the state before is not known
     std::vector<double> loadFactor, displacement, baseReaction, residual;
     std::vector<int> additional; // numbers of the steps that were asked for
     std::vector<T_PUSH_EVENT_ROW> events;
@@ -57,6 +59,7 @@ struct T_PUSH_PROGRESS {
     std::string name;
     std::size_t done = 0, total = 0; // steps
     double displacement = 0.0, baseReaction = 0.0;
+    double startDisplacement = 0.0, startReaction = 0.0; // before the first step
 };
 /// Told after each step; false: no further one is wanted.
 using PUSH_PROGRESS_FN = std::function<bool(const T_PUSH_PROGRESS&)>;

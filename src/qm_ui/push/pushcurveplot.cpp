@@ -32,6 +32,28 @@ T_PLOT_SERIES Curve(const std::string& name, std::size_t direction, const T_UNIT
 
 std::string NameOf(const T_PUSH_RUN& run, std::size_t hinge)
 {
+/// A value before the push; what is left of rounding would widen an axis by a tick.
+double BeforePush(double value, const std::vector<double>& steps)
+{
+    constexpr double kRounding = 1e-9; // of the largest value of a step
+    double largest = 0.0;
+    for (const double step : steps)
+        largest = std::max(largest, std::fabs(step));
+    return std::fabs(value) <= kRounding * largest ? 0.0 : value;
+}
+
+/// From the state before the push on, where it is known.
+T_PLOT_SERIES CurveFromStart(const T_PUSH_RUN& run, const T_UNITS& units,
+                             std::vector<double> displacement, std::vector<double> reaction)
+{
+    if (run.startReaction) {
+        displacement.insert(displacement.begin(),
+                            BeforePush(run.startDisplacement, run.displacement));
+        reaction.insert(reaction.begin(), BeforePush(*run.startReaction, run.baseReaction));
+    }
+    return Curve({}, run.direction, units, displacement, reaction);
+}
+
     const T_PUSH_LAW_PLACE& place = run.hinges[hinge].place;
     return Say("IDS_QM_UI_PUSH_HINGE_NAME", std::to_string(place.element), place.end,
                kComponentNames[static_cast<std::size_t>(place.component)]);
@@ -96,7 +118,8 @@ T_PLOT_SERIES VertexPath(const T_PUSH_RUN& run, const T_UNITS& units)
         displacement.push_back(run.displacement.back());
         reaction.push_back(run.baseReaction.back());
     }
-    T_PLOT_SERIES s = Curve({}, run.direction, units, displacement, reaction);
+    if (displacement.empty()) return {};
+    T_PLOT_SERIES s = CurveFromStart(run, units, std::move(displacement), std::move(reaction));
     s.line = PLOT_LINE::Solid;
     s.width = 0.9;
     s.color = T_PLOT_COLOR{150, 150, 150};
@@ -126,9 +149,11 @@ T_PLOT PushCurvePlot(std::span<const T_PUSH_RUN> runs, const T_UNITS& units,
                      const std::string& title)
 {
     T_PLOT plot = EmptyPlot(title, runs.empty() ? 0 : runs.front().direction, units);
-    for (const T_PUSH_RUN& run : runs)
-        plot.series.push_back(
-            Curve(run.name, run.direction, units, run.displacement, run.baseReaction));
+    for (const T_PUSH_RUN& run : runs) {
+        T_PLOT_SERIES curve = CurveFromStart(run, units, run.displacement, run.baseReaction);
+        curve.name = run.name;
+        plot.series.push_back(std::move(curve));
+    }
     if (runs.size() == 1) {
         T_PLOT_SERIES path = VertexPath(runs.front(), units);
         path.name = Say("IDS_QM_PLOT_PUSH_PATH");

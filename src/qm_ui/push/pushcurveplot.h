@@ -7,9 +7,10 @@
 
 #include <span>
 
-/// One curve through the steps of each run. Marked are the points at which hinges reach B (they
-/// yield; of trilinear curves: crack) and C for the first time: of a run alone all of them, with
-/// the exact path through its events; of several the first ones. The first B has its hinge's name.
+/// One curve through the steps of each run, from the state before its push on. Marked are the
+/// points at which hinges reach B (they yield; of trilinear curves: crack) and C for the first
+/// time: of a run alone all of them, with the exact path through its events; of several the first
+/// ones. The first B has its hinge's name.
 T_PLOT PushCurvePlot(std::span<const T_PUSH_RUN> runs, const T_UNITS& units,
                      const std::string& title);
 /// The curves of a run as far as they have come; those with their events once it has ended.
