@@ -51,6 +51,7 @@ std::string CPushOverRunDlg::CaseText(std::size_t row, std::size_t column) const
     if (column == 0) return record->second.name;
     const auto has = [key](const T_PUSH_RESULT_ID& id) { return id.key == key; };
     std::string why;
+    if (HasImportedSteps(m_doc, key)) return Say("IDS_QM_UI_PUSH_RUN_IMPORTED");
     if (std::ranges::none_of(PushResultsOf(m_doc), has)) return Say("IDS_QM_UI_PUSH_RUN_NONE");
     return Say(m_doc.Post().IsStale(key, why) ? "IDS_QM_UI_PUSH_RUN_OLD"
                                               : "IDS_QM_UI_PUSH_RUN_CURRENT");
@@ -85,10 +86,9 @@ int CPushOverRunDlg::OnRun()
     m_curves.clear();
     m_runs.clear();
     m_rows.clear();
-    std::vector<T_PUSH_TASK> tasks;
-    for (const int key : m_chosen)
-        tasks.push_back({key});
-    int done = Push(tasks);
+    std::vector<T_PUSH_TASK> tasks = FirstTasks();
+    int done = m_rows.empty() ? 1 : 0;
+    if (!tasks.empty()) done = Push(tasks) && done ? 1 : 0;
     tasks = FurtherTasks();
     if (!tasks.empty() && !m_cancel) done = Push(tasks) && done ? 1 : 0;
     if (m_changed) m_changed();
@@ -107,6 +107,24 @@ int CPushOverRunDlg::Push(const std::vector<T_PUSH_TASK>& tasks)
     }
     CPushRun(m_doc).Keep(m_runs);
     return done;
+}
+
+std::vector<T_PUSH_TASK> CPushOverRunDlg::FirstTasks()
+{
+    std::string names;
+    for (const int key : m_chosen)
+        if (HasImportedSteps(m_doc, key))
+            names += (names.empty() ? "" : ", ") + m_doc.Data().Model().pushovers.at(key).name;
+    constexpr const char* kAsk = "IDS_QM_UI_PUSH_RUN_REPLACE";
+    const bool keep = !names.empty() && !AskYesNo(kAsk, Say(kAsk, names));
+    std::vector<T_PUSH_TASK> tasks;
+    for (const int key : m_chosen) {
+        if (keep && HasImportedSteps(m_doc, key))
+            AddNotPushed(key, Say("IDS_QM_UI_PUSH_RUN_KEPT"));
+        else
+            tasks.push_back({key});
+    }
+    return tasks;
 }
 
 std::vector<T_PUSH_TASK> CPushOverRunDlg::FurtherTasks() const
@@ -167,13 +185,18 @@ int CPushOverRunDlg::TakeResults(CPushWorker& worker)
         }
         if (one.error.empty()) continue;
         done = 0;
-        T_ROW& row = m_rows.emplace_back();
-        row.key = one.key;
-        row.name = m_doc.Data().Model().pushovers.at(one.key).name;
-        row.outcome = Say("IDS_QM_UI_PUSH_RUN_REFUSED");
-        row.advice = one.error;
+        AddNotPushed(one.key, one.error);
     }
     return done;
+}
+
+void CPushOverRunDlg::AddNotPushed(int key, const std::string& why)
+{
+    T_ROW& row = m_rows.emplace_back();
+    row.key = key;
+    row.name = m_doc.Data().Model().pushovers.at(key).name;
+    row.outcome = Say("IDS_QM_UI_PUSH_RUN_REFUSED");
+    row.advice = why;
 }
 
 void CPushOverRunDlg::AddRow(const T_PUSH_RUN& run)

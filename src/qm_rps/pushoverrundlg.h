@@ -45,8 +45,9 @@ public:
 
     /// Pushes the chosen load cases in a thread of their own and calls m_changed with each news;
     /// in the end the results are those of the document. Load cases that ask for steps at what
-    /// their evaluations find are then pushed again with these. 1 each came to an end, good or not;
-    /// 0 nothing is chosen, or a load case could not be pushed (its row says why).
+    /// their evaluations find are then pushed again with these. Load cases with steps of another
+    /// solver are pushed only if the person says so. 1 each came to an end, good or not; 0 nothing
+    /// is chosen, or a load case was not pushed (its row says why).
     [[nodiscard]] int OnRun();
     bool CanRun() const { return !m_running && !m_chosen.empty(); }
     bool IsRunning() const { return m_running; }
@@ -70,11 +71,13 @@ public:
 
 private:
     [[nodiscard]] int Push(const std::vector<T_PUSH_TASK>& tasks);
+    std::vector<T_PUSH_TASK> FirstTasks();
     std::vector<T_PUSH_TASK> FurtherTasks() const;
     void Watch(CPushWorker& worker);
     void TakeStep(const T_PUSH_PROGRESS& step);
     [[nodiscard]] int TakeResults(CPushWorker& worker);
     void AddRow(const T_PUSH_RUN& run);
+    void AddNotPushed(int key, const std::string& why);
 
     CDBDoc& m_doc;
     std::vector<int> m_cases; // keys

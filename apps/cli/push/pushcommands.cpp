@@ -68,15 +68,12 @@ EXIT_CODE PrintTables(const T_PUSH_OPTIONS& o, const std::vector<T_PUSH_RUN>& ru
     return EXIT_CODE::Done;
 }
 
-/// Steps of another solver can't be had again from the model: the push does not put its own in
-/// their place in the file that it reads, unless it is told to.
+/// Steps of another solver stay in the file that is read, unless the user says otherwise.
 EXIT_CODE KeepImported(CDBDoc& doc, const T_PUSH_OPTIONS& o, const std::vector<int>& keys)
 {
     if (o.overwrite || o.noStore || !o.out.empty() || !IsModelFile(o.file)) return EXIT_CODE::Done;
-    const T_RESULT_MAP& results = doc.Data().Content().results;
     for (const int key : keys) {
-        const auto it = results.find(key);
-        if (it == results.end() || !it->second || it->second->Run()) continue;
+        if (!HasImportedSteps(doc, key)) continue;
         const std::string& name = doc.Data().Model().pushovers.at(key).name;
         return Complain(EXIT_CODE::NoAccess, o.file + ": " + Say("IDS_QM_CLI_PUSH_IMPORTED", name));
     }

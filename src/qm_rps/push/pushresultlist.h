@@ -13,6 +13,10 @@ struct T_PUSH_RESULT_ID {
 /// Those of our own, by the keys of the load cases.
 std::vector<T_PUSH_RESULT_ID> PushResultsOf(CDBDoc& doc);
 
+/// Steps of another solver can't be had again from the model: no push puts its own in their place
+/// unless it is told to.
+bool HasImportedSteps(CDBDoc& doc, int key);
+
 /// Steps and displacements of a result that is older than the model: without states of hinges and
 /// storey values, which the present model does not know. 1 done; 0 `error` says why not.
 [[nodiscard]] int ReadOldRun(CDBDoc& doc, const T_PUSH_RESULT_ID& id, T_PUSH_RUN& out,
