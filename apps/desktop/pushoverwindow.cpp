@@ -35,6 +35,12 @@ CPushOverWindow::CPushOverWindow(T_DESKTOP& desktop, const T_VIEW& view, CPushOv
     m_edit.m_askPath = [this](const char* filterKey) {
         return AskFileName(this, true, windowTitle(), Text(filterKey)).toStdString();
     };
+    m_edit.m_withProgress = [this](const CPushOverCurveEdit::PUSHING_FN& pushing) {
+        (void)RunWithProgress(this, Text("IDS_QM_UI_PUSH_POINTS_TITLE"), [&](auto tell) {
+            pushing([&](const T_PUSH_PROGRESS& p) { return tell(p.done, p.total); });
+            return 1;
+        });
+    };
     auto* timer = new QTimer(this);
     connect(timer, &QTimer::timeout, this, [this] { LookAtDocument(); });
     timer->start(kLookMs);

@@ -85,9 +85,32 @@ struct T_WANTED {
     std::vector<T_PUSH_POINT> points;
 };
 
-/// Pushes a load case to the points of its evaluations, and shares these out.
-void PushToPoints(CPushRun& push, int key, const T_POLC_D& record,
-                  const std::vector<T_WANTED>& wanted, const PUSH_PROGRESS_FN& progress)
+/// The points of an evaluation on a push of our own that is not older than the model, and the key
+/// of its load case; without such a push `to` stays empty, a note says why there are no points.
+T_WANTED WantedOf(CDBDoc& doc, const T_PUSH_EVALUATION& e, int& key, T_HINGES_AT& to)
+{
+    const T_MODEL& model = doc.Data().Model();
+    const auto push = FindPush(model, e.eval.push);
+    IPushRun* const run = push ? doc.Post().RunOf(push->key, push->turn) : nullptr;
+    std::string old;
+    if (!run || doc.Post().IsStale(push->key, old, push->turn)) return {};
+    key = push->key;
+    to.evaluation = e.eval.name.empty() ? MethodName(e.eval.method) : e.eval.name;
+    to.push = e.eval.push;
+    to.units = e.units;
+    const int controlNode = model.pushovers.at(key).controlNode;
+    if (e.loadCase.controlNode != controlNode) {
+        to.note = Say("IDS_QM_PUSH_AT_OTHER_NODE", std::to_string(e.loadCase.controlNode),
+                      std::to_string(controlNode));
+        return {};
+    }
+    return {&to, push->turn, PointsOf(e, WayOf(*run, controlNode))};
+}
+
+/// Pushes a load case to the points of its evaluations, and shares these out. The run of the first
+/// of them; empty: the notes say why not.
+T_PUSH_RUN PushToPoints(CPushRun& push, int key, const T_POLC_D& record,
+                        const std::vector<T_WANTED>& wanted, const PUSH_PROGRESS_FN& progress)
 {
     std::vector<T_PUSH_POINT> all;
     for (const T_WANTED& one : wanted)
@@ -103,6 +126,8 @@ void PushToPoints(CPushRun& push, int key, const T_POLC_D& record,
         const auto run = std::ranges::find(runs, one.turn, &T_PUSH_RUN::turn);
         if (note.empty() && run != runs.end()) one.to->points = PushAtPoints(*run, one.points);
     }
+    const auto first = std::ranges::find(runs, wanted.front().turn, &T_PUSH_RUN::turn);
+    return note.empty() && first != runs.end() ? std::move(*first) : T_PUSH_RUN();
 }
 
 } // namespace
@@ -136,28 +161,52 @@ std::vector<T_HINGES_AT> HingesOfEvaluations(CDBDoc& doc,
 {
     std::vector<T_HINGES_AT> out(results.size());
     std::map<int, std::vector<T_WANTED>> wanted; // by load case
-    const T_MODEL& model = doc.Data().Model();
     for (std::size_t i = 0; i < results.size(); ++i) {
-        const T_PUSH_EVALUATION& e = results[i];
-        const auto push = FindPush(model, e.eval.push);
-        IPushRun* const run = push ? doc.Post().RunOf(push->key, push->turn) : nullptr;
-        std::string old;
-        if (!run || doc.Post().IsStale(push->key, old, push->turn)) continue;
-        out[i].evaluation = e.eval.name.empty() ? MethodName(e.eval.method) : e.eval.name;
-        out[i].push = e.eval.push;
-        out[i].units = e.units;
-        const int controlNode = model.pushovers.at(push->key).controlNode;
-        if (e.loadCase.controlNode != controlNode)
-            out[i].note = Say("IDS_QM_PUSH_AT_OTHER_NODE", std::to_string(e.loadCase.controlNode),
-                              std::to_string(controlNode));
-        if (!out[i].note.empty()) continue;
-        std::vector<T_PUSH_POINT> points = PointsOf(e, WayOf(*run, controlNode));
-        if (!points.empty()) wanted[push->key].push_back({&out[i], push->turn, std::move(points)});
+        int key = 0;
+        T_WANTED one = WantedOf(doc, results[i], key, out[i]);
+        if (!one.points.empty()) wanted[key].push_back(std::move(one));
     }
     CPushRun push(doc);
     for (const auto& [key, of] : wanted)
-        PushToPoints(push, key, model.pushovers.at(key), of, progress);
+        (void)PushToPoints(push, key, doc.Data().Model().pushovers.at(key), of, progress);
     return out;
+}
+
+T_HINGES_AT PushToEvaluation(CDBDoc& doc, const T_PUSH_EVALUATION& result,
+                             const PUSH_PROGRESS_FN& progress, T_PUSH_RUN& run)
+{
+    T_HINGES_AT out;
+    int key = 0;
+    T_WANTED wanted = WantedOf(doc, result, key, out);
+    run = {};
+    if (wanted.points.empty()) return out;
+    CPushRun push(doc);
+    run = PushToPoints(push, key, doc.Data().Model().pushovers.at(key), {std::move(wanted)},
+                       progress);
+    return out;
+}
+
+int EvaluateStored(CDBDoc& doc, const std::string& name, T_PUSH_EVALUATION& out, std::string& error)
+{
+    const auto& records = doc.Data().Model().evaluations;
+    const auto record =
+        std::ranges::find_if(records, [&](const auto& e) { return e.second.name == name; });
+    T_EVAL_D eval;
+    if (record == records.end() || !doc.Attr().GetEval(record->first, eval)) {
+        error = Say("IDS_QM_CLI_NO_EVALUATION", name);
+        return 0;
+    }
+    CPushEvaluator evaluator(doc, RunPerfPtProcedure);
+    evaluator.SetStoreSteps(false);
+    evaluator.SetFindAllPoints(false);
+    T_FINDING refusal;
+    if (!evaluator.SetEvaluation(eval, refusal)) {
+        error = refusal.text;
+        return 0;
+    }
+    evaluator.Evaluate();
+    out = evaluator.Result();
+    return 1;
 }
 
 std::vector<double> StepsOfEvaluations(CDBDoc& doc, std::span<const T_PUSH_RUN> runs)

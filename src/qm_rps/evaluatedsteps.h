@@ -23,3 +23,13 @@ std::vector<double> StepsOfEvaluations(CDBDoc& doc, std::span<const T_PUSH_RUN> 
 std::vector<T_HINGES_AT> HingesOfEvaluations(CDBDoc& doc,
                                              std::span<const T_PUSH_EVALUATION> results,
                                              const PUSH_PROGRESS_FN& progress);
+
+/// The same of one evaluation, with the push whose steps the points are (PushAtPoints); the run is
+/// empty where there is no point or a note says why.
+T_HINGES_AT PushToEvaluation(CDBDoc& doc, const T_PUSH_EVALUATION& result,
+                             const PUSH_PROGRESS_FN& progress, T_PUSH_RUN& run);
+
+/// Evaluates a stored evaluation; the document stays as it is. 1 done, whatever was found; 0 error
+/// says that there is none of this name, or what it refuses.
+[[nodiscard]] int EvaluateStored(CDBDoc& doc, const std::string& name, T_PUSH_EVALUATION& out,
+                                 std::string& error);

@@ -9,6 +9,7 @@
 #include "qm_rps/pushover/report/pushoverreport.h"
 #include "qm_rps/pushovercomparisondlg.h"
 #include "qm_rps/pushovercontroldlg.h"
+#include "qm_rps/pushoverhingestatedlg.h"
 #include "qm_rps/pushovertextdlg.h"
 
 using zql::lib::MMSGFunction;
@@ -274,9 +275,40 @@ void CPushOverCurveEdit::ShowText(const char* titleKey, std::string text)
 void CPushOverCurveEdit::OnPushoverCurveTextout()
 {
     const T_PUSH_EVALUATION& result = m_shown.Result();
-    const auto hinges = HingesOfEvaluations(m_doc, {&result, 1}, {});
+    std::vector<T_HINGES_AT> hinges;
+    Pushing([&](const PUSH_PROGRESS_FN& progress) {
+        hinges = HingesOfEvaluations(m_doc, {&result, 1}, progress);
+    });
     ShowText("IDS_QM_UI_PUSH_REPORT_TITLE",
              PushoverReportText(result) + HingesAtReport(hinges.front()));
+}
+
+void CPushOverCurveEdit::Pushing(const PUSHING_FN& pushing) const
+{
+    if (m_withProgress)
+        m_withProgress(pushing);
+    else
+        pushing({});
+}
+
+int CPushOverCurveEdit::OnHinges()
+{
+    CPushOverHingeStateDlg states(m_doc);
+    std::string why;
+    int done = 0;
+    if (Update())
+        Pushing([&](const PUSH_PROGRESS_FN& progress) {
+            done = states.OnShowPoints(m_shown.Result(), progress, why);
+        });
+    else
+        why = m_shown.Refused();
+    if (!done) {
+        ShowMessage("IDS_QM_UI_PUSH_POINTS_NONE", why);
+        return 0;
+    }
+    states.SetView(View());
+    (void)states.DoModal();
+    return 1;
 }
 
 void CPushOverCurveEdit::OnCurveText()

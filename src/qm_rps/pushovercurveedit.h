@@ -5,6 +5,7 @@
 // last picture and values, with the reason.
 #pragma once
 
+#include "qm_rps/push/pushrun.h"
 #include "qm_rps/pushover/report/shownevaluation.h"
 #include "qm_rps/pushovercurvedlg.h"
 #include "qm_rps/pushovercurvesub1dlg.h"
@@ -74,11 +75,16 @@ public:
     /// Previews of the report and of the curve table, from where they are saved.
     void OnPushoverCurveTextout();
     void OnCurveText();
+    /// The hinges at the points of the result, in their window. 0 with a message why not.
+    int OnHinges();
     /// Every method on the load case and spectrum of the settings.
     void OnCompare();
     /// Asks for the name of a file of the kind that the filter (a key) names; empty: cancelled.
     std::string AskPath(const char* filterKey) const;
     std::function<std::string(const char* filterKey)> m_askPath;
+    /// Runs a push with a window that shows its progress and can stop it; empty: it runs without.
+    using PUSHING_FN = std::function<void(const PUSH_PROGRESS_FN&)>;
+    std::function<void(const PUSHING_FN& pushing)> m_withProgress;
     /// Says that a picture could not be written or printed, and why.
     void SayNotWritten(const std::string& why) { ShowMessage("IDS_QM_UI_FILE_REFUSED", why); }
 
@@ -100,6 +106,7 @@ private:
     void ListAgain();
     int Say(const char* key);
     int SayRefusal();
+    void Pushing(const PUSHING_FN& pushing) const;
     void ShowText(const char* titleKey, std::string text);
 
     CDBDoc& m_doc;

@@ -5,6 +5,7 @@
 #include "qm_rps/push/pushquantity.h"
 
 #include <algorithm>
+#include <cmath>
 
 CPushOverHingeStateDlg::CPushOverHingeStateDlg(CDBDoc& doc) : CPushOverResultDlg(doc), m_scene(doc)
 {
@@ -24,18 +25,23 @@ void CPushOverHingeStateDlg::OnShown(bool anotherResult)
                 break;
             }
     }
-    ShowMoves();
-    if (anotherResult) m_scale = CFrameScene::RoundScale(Scene(), m_moves);
+    if (anotherResult && Step() > 0) {
+        const auto furthest = std::ranges::max_element(
+            run.displacement, {}, [](double displacement) { return std::fabs(displacement); });
+        ShowMoves(static_cast<int>(furthest - run.displacement.begin()) + 1);
+        m_scale = CFrameScene::RoundScale(Scene(), m_moves);
+    }
+    ShowMoves(Step());
     if (Step() > 0) ShowStates(run, Step(), m_hinge, m_marks);
     ShowRows();
 }
 
-void CPushOverHingeStateDlg::ShowMoves()
+void CPushOverHingeStateDlg::ShowMoves(int step)
 {
     const T_RUN_DATA& data = Run().data;
-    if (Step() > 0)
+    if (step > 0)
         m_moves = MovesOf(Scene(), data.nodes,
-                          data.displacement.at(static_cast<std::size_t>(Step() - 1)), Units());
+                          data.displacement.at(static_cast<std::size_t>(step - 1)), Units());
     else
         m_moves.assign(Scene().nodes.size(), {});
 }

@@ -38,7 +38,7 @@ public:
 
 private:
     void OnShown(bool anotherResult) override;
-    void ShowMoves();
+    void ShowMoves(int step);
     void ShowRows();
 
     CFrameScene m_scene;

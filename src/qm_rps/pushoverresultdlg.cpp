@@ -2,6 +2,7 @@
 
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/push/pushatpointtext.h"
 #include "qm_rps/push/pushquantity.h"
 
 #include <algorithm>
@@ -16,6 +17,8 @@ std::vector<std::string> CPushOverResultDlg::ResultTexts() const
     std::vector<std::string> names;
     for (const T_PUSH_RESULT_ID& id : m_results)
         names.push_back(id.name);
+    if (!m_points.points.empty())
+        names.push_back(Say("IDS_QM_UI_PUSH_WITH_POINTS", m_points.push, m_points.evaluation));
     return names;
 }
 
@@ -24,16 +27,78 @@ void CPushOverResultDlg::OnSelChangeResult(int index)
     m_run = {};
     m_old.clear();
     m_error.clear();
-    m_index = index >= 0 && index < std::ssize(m_results) ? index : -1;
-    if (m_index >= 0) {
+    const std::ptrdiff_t count = std::ssize(m_results) + (m_points.points.empty() ? 0 : 1);
+    m_index = index >= 0 && index < count ? index : -1;
+    if (m_index >= 0 && ShowsPoints()) {
+        m_run = m_pointsRun;
+    } else if (m_index >= 0) {
         const T_PUSH_RESULT_ID& id = m_results[static_cast<std::size_t>(m_index)];
         if (m_doc.Post().IsStale(id.key, m_old, id.turn))
             (void)ReadOldRun(m_doc, id, m_run, m_error);
         else
             (void)m_reader.Read(id.key, id.turn, m_run, m_error);
     }
-    m_step = Steps();
+    m_step = ShowsPoints() ? FirstPoint().step : Steps();
     OnShown(true);
+}
+
+/// What an evaluation asks for stands before what the structure can do.
+const T_PUSH_AT_POINT& CPushOverResultDlg::FirstPoint() const
+{
+    const auto at = std::ranges::find_if(m_points.points, [](const T_PUSH_AT_POINT& p) {
+        return p.point.kind != PUSH_POINT::Capacity;
+    });
+    return at == m_points.points.end() ? m_points.points.front() : *at;
+}
+
+int CPushOverResultDlg::OnShowPoints(const T_PUSH_EVALUATION& result,
+                                     const PUSH_PROGRESS_FN& progress, std::string& error)
+{
+    T_PUSH_RUN run;
+    T_HINGES_AT points = PushToEvaluation(m_doc, result, progress, run);
+    error = points.push.empty()     ? Say("IDS_QM_UI_PUSH_POINTS_NO_PUSH", result.eval.push)
+            : !points.note.empty()  ? points.note
+            : points.points.empty() ? Say("IDS_QM_UI_PUSH_POINTS_NONE")
+                                    : WhyNot(points.points.front().found);
+    std::erase_if(points.points,
+                  [](const T_PUSH_AT_POINT& at) { return at.found != AT_POINT::Reached; });
+    if (points.points.empty()) return 0;
+    m_points = std::move(points);
+    m_pointsRun = std::move(run);
+    OnSelChangeResult(static_cast<int>(std::ssize(m_results)));
+    return 1;
+}
+
+std::vector<std::string> CPushOverResultDlg::PointTexts() const
+{
+    std::vector<std::string> names;
+    if (ShowsPoints())
+        for (const T_PUSH_AT_POINT& at : m_points.points)
+            names.push_back(PointName(at.point));
+    return names;
+}
+
+int CPushOverResultDlg::PointIndex() const
+{
+    if (!ShowsPoints()) return -1;
+    const auto at = std::ranges::find(m_points.points, m_step, &T_PUSH_AT_POINT::step);
+    return at == m_points.points.end() ? -1 : static_cast<int>(at - m_points.points.begin());
+}
+
+void CPushOverResultDlg::OnSelChangePoint(int index)
+{
+    if (ShowsPoints() && index >= 0 && index < std::ssize(m_points.points))
+        OnStep(m_points.points[static_cast<std::size_t>(index)].step);
+}
+
+int CPushOverResultDlg::OnShowState(const std::string& state)
+{
+    const auto at = std::ranges::find_if(m_points.points, [&](const T_PUSH_AT_POINT& p) {
+        return p.point.kind == PUSH_POINT::Demand && p.point.state == state;
+    });
+    if (!ShowsPoints() || at == m_points.points.end()) return 0;
+    OnStep(at->step);
+    return 1;
 }
 
 int CPushOverResultDlg::OnOpen(const std::string& name)
@@ -62,13 +127,28 @@ std::string CPushOverResultDlg::StatusText() const
     return IsOld() ? m_old : m_run.advice;
 }
 
+std::string CPushOverResultDlg::PointText() const
+{
+    const int point = PointIndex();
+    if (point < 0) return {};
+    return PointName(m_points.points[static_cast<std::size_t>(point)].point) + ", " +
+           m_points.evaluation;
+}
+
+std::string CPushOverResultDlg::StepName() const
+{
+    const std::string point = PointText();
+    return Say("IDS_QM_PLOT_PUSH_STEP", std::to_string(m_step)) +
+           (point.empty() ? "" : " (" + point + ")");
+}
+
 std::string CPushOverResultDlg::StepText() const
 {
     if (m_step < 1) return {};
     const auto i = static_cast<std::size_t>(m_step - 1);
     const T_PUSH_QUANTITY displacement = DisplacementIn(m_run.direction, Units());
     const T_PUSH_QUANTITY reaction = ReactionIn(m_run.direction, Units());
-    return Say("IDS_QM_UI_PUSH_STEP_OF", std::to_string(m_step), std::to_string(Steps()),
+    return Say("IDS_QM_UI_PUSH_STEP_OF", StepName(), std::to_string(Steps()),
                FormatText("%.5g", m_run.loadFactor[i]),
                FormatText("%.5g", displacement.Shown(m_run.displacement[i])) + " " +
                    displacement.Unit(),

@@ -2,6 +2,7 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
+#include "qm_rps/evaluatedsteps.h"
 #include "qm_rps/push/pushresultlist.h"
 
 class CPushOverResultDlg : public zql::frx::MDialog {
@@ -16,6 +17,18 @@ public:
     /// 1 shown; 0 there is no such result.
     [[nodiscard]] int OnOpen(const std::string& name);
 
+    /// The push of an evaluation with its points as steps, beside the stored results: pushed again,
+    /// so that nothing is interpolated. At the performance point, else at the first demand that the
+    /// push has reached. 1 shown; 0 `error` says why not, what is shown stays.
+    [[nodiscard]] int OnShowPoints(const T_PUSH_EVALUATION& result,
+                                   const PUSH_PROGRESS_FN& progress, std::string& error);
+    /// Points of the shown result: "performance point", "SD: demand"; none of a stored one.
+    std::vector<std::string> PointTexts() const;
+    int PointIndex() const; // -1: the step is none
+    void OnSelChangePoint(int index);
+    /// The step of the demand of a limit state. 1 shown; 0 the result has no such point.
+    [[nodiscard]] int OnShowState(const std::string& state);
+
     const T_PUSH_RUN& Run() const { return m_run; } // empty: none could be read
     /// The results are older than the model: only curve and displacements are shown.
     bool IsOld() const { return !m_old.empty(); }
@@ -28,6 +41,10 @@ public:
     int Step() const { return m_step; } // from 1; 0: there is none
     /// Beyond the ends: the nearest one.
     void OnStep(int step);
+    /// "performance point, PX ATC": what the step is; empty: no point.
+    std::string PointText() const;
+    /// "Step 12", at a point "Step 12 (performance point, PX ATC)".
+    std::string StepName() const;
     /// Load factor, displacement and base reaction of the step.
     std::string StepText() const;
     T_UNITS Units() const { return m_doc.Data().Units(); }
@@ -41,7 +58,12 @@ protected:
     CDBDoc& m_doc;
 
 private:
+    const T_PUSH_AT_POINT& FirstPoint() const;
+    bool ShowsPoints() const { return m_index == std::ssize(m_results); }
+
     std::vector<T_PUSH_RESULT_ID> m_results;
+    T_HINGES_AT m_points; // reached ones alone; no evaluation: there are none
+    T_PUSH_RUN m_pointsRun;
     CPushRun m_reader;
     int m_index = -1, m_step = 0;
     T_PUSH_RUN m_run;

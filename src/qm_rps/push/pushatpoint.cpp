@@ -43,6 +43,7 @@ bool IsWorse(const T_HINGE_AT_POINT& a, const T_HINGE_AT_POINT& b)
 void TakeStep(const T_PUSH_RUN& run, std::size_t step, T_PUSH_AT_POINT& to)
 {
     to.found = AT_POINT::Reached;
+    to.step = static_cast<int>(step) + 1;
     to.loadFactor = run.loadFactor[step];
     for (const T_PUSH_HINGE_SERIES& hinge : run.hinges) {
         const PUSH_STATE state = hinge.state[step];

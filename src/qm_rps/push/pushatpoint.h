@@ -36,6 +36,7 @@ enum class AT_POINT {
 struct T_PUSH_AT_POINT {
     T_PUSH_POINT point;
     AT_POINT found = AT_POINT::Beyond; // what follows is of a point that was reached
+    int step = 0;                      // of the run, from 1
     double loadFactor = 0.0;
     std::array<std::size_t, kPushStateNames.size()> states{}; // components by state
     /// At most kMostWorst, none is elastic: those beyond C, then by falling ratio.

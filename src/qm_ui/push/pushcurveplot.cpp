@@ -3,6 +3,8 @@
 #include "qm_base/say.h"
 #include "qm_rps/push/pushquantity.h"
 
+#include <algorithm>
+#include <cmath>
 #include <set>
 
 namespace {
@@ -30,8 +32,6 @@ T_PLOT_SERIES Curve(const std::string& name, std::size_t direction, const T_UNIT
     return s;
 }
 
-std::string NameOf(const T_PUSH_RUN& run, std::size_t hinge)
-{
 /// A value before the push; what is left of rounding would widen an axis by a tick.
 double BeforePush(double value, const std::vector<double>& steps)
 {
@@ -54,6 +54,8 @@ T_PLOT_SERIES CurveFromStart(const T_PUSH_RUN& run, const T_UNITS& units,
     return Curve({}, run.direction, units, displacement, reaction);
 }
 
+std::string NameOf(const T_PUSH_RUN& run, std::size_t hinge)
+{
     const T_PUSH_LAW_PLACE& place = run.hinges[hinge].place;
     return Say("IDS_QM_UI_PUSH_HINGE_NAME", std::to_string(place.element), place.end,
                kComponentNames[static_cast<std::size_t>(place.component)]);
@@ -183,6 +185,7 @@ T_PLOT StepCurvePlot(const CPushOverResultDlg& shown)
     const T_PUSH_RUN& run = shown.Run();
     if (shown.Step() < 1) return {};
     T_PLOT plot = PushCurvePlot({&run, 1}, shown.Units(), shown.TitleText());
+    plot.subtitle = shown.PointText();
     const auto i = static_cast<std::size_t>(shown.Step() - 1);
     const double x = DisplacementIn(run.direction, shown.Units()).Shown(run.displacement[i]);
     const double y = ReactionIn(run.direction, shown.Units()).Shown(run.baseReaction[i]);

@@ -27,6 +27,12 @@ void AddHead(CFormView& form, CPushOverResultDlg& shown)
     form.Custom(KeyText("IDS_QM_UI_SHAPE_STEP"), MakeStepField(shown, form.Changed(), form.Host()))
         .name = "step";
     form.EndColumns();
+    CFormField& point = form.Choice(KeyText("IDS_QM_UI_PUSH_POINT"),
+                                    {[&shown] { return shown.PointIndex(); },
+                                     [&shown](const int& index) { shown.OnSelChangePoint(index); }},
+                                    [&shown] { return shown.PointTexts(); });
+    point.name = "point";
+    point.shown = [&shown] { return !shown.PointTexts().empty(); };
     form.Note([&shown] { return shown.StepText(); });
     form.Note([&shown] { return shown.StatusText(); });
 }

@@ -61,6 +61,7 @@ T_PLOT StoreyPlot(const CPushOverStoreyDlg& shown, STOREY_VALUE value)
     const T_LOOK& look = kLooks[static_cast<std::size_t>(value)];
     const T_PUSH_QUANTITY q{look.dim, shown.Units()};
     plot.title = shown.TitleText();
+    plot.subtitle = shown.PointText();
     plot.x.title = value == STOREY_VALUE::Drift ? Say(look.title) : q.Head(look.title);
     plot.y.title = T_PUSH_QUANTITY{kDimLength, shown.Units()}.Head("IDS_QM_UI_STOREY_HEIGHT");
     if (!shown.HasStoreys()) return plot;
@@ -75,7 +76,7 @@ T_PLOT StoreyPlot(const CPushOverStoreyDlg& shown, STOREY_VALUE value)
     plot.series.push_back(std::move(now));
     // The axis stays as the slider moves.
     T_PLOT_SERIES most = OverHeight(storeys, value, shown.Units(), Envelope);
-    most.name = Say("IDS_QM_PLOT_STOREY_LARGEST");
+    most.name = Say("IDS_QM_UI_STOREY_LARGEST");
     most.color = T_PLOT_COLOR{190, 90, 20};
     most.line = PLOT_LINE::Dash;
     plot.series.push_back(std::move(most));
