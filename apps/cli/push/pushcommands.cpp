@@ -6,9 +6,11 @@
 #include "push/pushtable.h"
 #include "qm_base/say.h"
 #include "qm_rps/desk/elementlist.h"
+#include "qm_rps/push/pushresultlist.h"
 #include "json/pushjson.h"
 
 #ifdef QM_UI
+#include "push/pushpictures.h"
 #include "qm_ui/push/pushcurveplot.h"
 #endif
 
@@ -49,6 +51,21 @@ EXIT_CODE ReadNodes(CDBDoc& doc, const T_PUSH_OPTIONS& o, std::set<int>& out)
                             o.file + ": " + Say("IDS_QM_ANALYSIS_NO_NODE", std::to_string(id)));
         out.insert(id);
     }
+    return EXIT_CODE::Done;
+}
+
+/// What chooses a step needs a picture of one; a step is chosen in one way.
+EXIT_CODE CheckStepOptions(const T_PUSH_OPTIONS& o)
+{
+    const bool pictures = !o.plotHinges.empty() || !o.plotStoreys.empty();
+    const bool chooses = o.step > 0 || !o.at.empty() || !o.of.empty() || !o.state.empty();
+    if (chooses && !pictures) return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_PUSH_STEP_ALONE"));
+    if (o.step > 0 && !o.at.empty())
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_SETUP_BOTH", "--step", "--at"));
+    if (!o.of.empty() && !o.at.empty())
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_SETUP_BOTH", "--of", "--at"));
+    if (!o.state.empty() && o.at.empty())
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_PUSH_STATE_ALONE"));
     return EXIT_CODE::Done;
 }
 
@@ -97,10 +114,14 @@ EXIT_CODE RunPush(const T_PUSH_OPTIONS& o)
         return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_SETUP_BOTH", "--all", "--case"));
     if (!o.nodes.empty() && o.json.empty())
         return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_PUSH_NODES_JSON"));
-    if (const EXIT_CODE code = CheckPlotName(o.plot); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = CheckStepOptions(o); code != EXIT_CODE::Done) return code;
+    for (const std::string& picture : {o.plot, o.plotHinges, o.plotStoreys})
+        if (const EXIT_CODE code = CheckPlotName(picture); code != EXIT_CODE::Done) return code;
     if (const EXIT_CODE code = CheckOutputs(o.file,
                                             {{o.json, OUTPUT_KIND::Json},
                                              {o.plot, OUTPUT_KIND::Picture},
+                                             {o.plotHinges, OUTPUT_KIND::Picture},
+                                             {o.plotStoreys, OUTPUT_KIND::Picture},
                                              {o.out, OUTPUT_KIND::Model}},
                                             o.overwrite);
         code != EXIT_CODE::Done)
@@ -112,6 +133,9 @@ EXIT_CODE RunPush(const T_PUSH_OPTIONS& o)
     if (const EXIT_CODE code = FindCases(doc, o, keys); code != EXIT_CODE::Done) return code;
     if (const EXIT_CODE code = ReadNodes(doc, o, nodes); code != EXIT_CODE::Done) return code;
     if (const EXIT_CODE code = KeepImported(doc, o, keys); code != EXIT_CODE::Done) return code;
+#ifdef QM_UI
+    if (const EXIT_CODE code = CheckSteps(doc, o, keys); code != EXIT_CODE::Done) return code;
+#endif
     std::vector<T_PUSH_RUN> runs;
     const T_UNITS units = doc.Unit().Units();
     if (const EXIT_CODE code = PushCases(doc, o.file, keys, runs); code != EXIT_CODE::Done)
@@ -124,6 +148,7 @@ EXIT_CODE RunPush(const T_PUSH_OPTIONS& o)
 #ifdef QM_UI
     if (code == EXIT_CODE::Done && !o.plot.empty())
         code = WritePicture(PushCurvePlot(runs, units, doc.Data().Model().styp.title), o.plot);
+    if (code == EXIT_CODE::Done) code = DrawSteps(doc, o, runs);
 #endif
     if (code == EXIT_CODE::Done) code = Store(doc, o);
     if (code != EXIT_CODE::Done) return code;

@@ -12,6 +12,10 @@ struct T_PUSH_OPTIONS {
     bool all = false;                // every one, those that can't be pushed refused
     std::string json;                // file, or "-" for standard output
     std::string plot;                // capacity curves: .svg, .png or .pdf
+    std::string plotHinges;          // the frame with the states of its hinges
+    std::string plotStoreys;         // storeys over the height
+    std::string of, at, state;       // result, evaluation, its limit state that these two show
+    int step = 0;                    // likewise; 0: the last one, or that of `at`
     std::vector<std::string> hinges; // results whose hinges are printed
     std::string nodes;               // "1,5-9": displacements of these in the JSON
     std::string out;                 // write the model with its results here (.qmdb)

@@ -25,8 +25,7 @@ bool ShowStep(const T_PUSH_PROGRESS& p, const T_UNITS& units)
 EXIT_CODE PushOne(CDBDoc& doc, const std::string& file, CPushRun& push, int key,
                   std::vector<T_PUSH_RUN>& out)
 {
-    const T_UNITS units = doc.Unit().Units();
-    const auto progress = [&](const T_PUSH_PROGRESS& p) { return ShowStep(p, units); };
+    const PUSH_PROGRESS_FN progress = ProgressOnTerminal(doc);
     std::vector<T_PUSH_RUN> runs;
     std::string error;
     if (!push.Run(key, progress, runs, error))
@@ -46,6 +45,11 @@ EXIT_CODE PushOne(CDBDoc& doc, const std::string& file, CPushRun& push, int key,
 }
 
 } // namespace
+
+PUSH_PROGRESS_FN ProgressOnTerminal(CDBDoc& doc)
+{
+    return [units = doc.Unit().Units()](const T_PUSH_PROGRESS& p) { return ShowStep(p, units); };
+}
 
 EXIT_CODE PushCases(CDBDoc& doc, const std::string& file, const std::vector<int>& keys,
                     std::vector<T_PUSH_RUN>& out)
@@ -85,7 +89,5 @@ EXIT_CODE PushWhereMissing(CDBDoc& doc, const std::string& file, const std::set<
 std::vector<T_HINGES_AT> HingesAtPoints(CDBDoc& doc, const std::vector<T_PUSH_EVALUATION>& results)
 {
     const CInterrupt interrupt;
-    const T_UNITS units = doc.Unit().Units();
-    return HingesOfEvaluations(doc, results,
-                               [&](const T_PUSH_PROGRESS& p) { return ShowStep(p, units); });
+    return HingesOfEvaluations(doc, results, ProgressOnTerminal(doc));
 }

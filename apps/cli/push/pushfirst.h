@@ -17,6 +17,9 @@ EXIT_CODE PushCases(CDBDoc& doc, const std::string& file, const std::vector<int>
 /// data stays without.
 EXIT_CODE PushWhereMissing(CDBDoc& doc, const std::string& file, const std::set<int>& keys);
 
+/// Shows the steps where somebody looks at them; Ctrl-C asks to stop while a CInterrupt lives.
+PUSH_PROGRESS_FN ProgressOnTerminal(CDBDoc& doc);
+
 /// What the hinges do at the points of these evaluations, with progress on a terminal; Ctrl-C ends
 /// it, the evaluations stand.
 std::vector<T_HINGES_AT> HingesAtPoints(CDBDoc& doc, const std::vector<T_PUSH_EVALUATION>& results);

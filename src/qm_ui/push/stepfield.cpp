@@ -1,10 +1,8 @@
 #include "qm_ui/push/stepfield.h"
 
-#include "qm_base/say.h"
-#include "qm_base/textformat.h"
-#include "qm_ui/form/localnumber.h"
 #include "qm_ui/frame/frameview.h"
 #include "qm_ui/plot/plotwidget.h"
+#include "qm_ui/push/stepdrawings.h"
 
 #include <QSignalBlocker>
 #include <QSlider>
@@ -58,23 +56,7 @@ public:
             changed();
         };
     }
-    void Show() override
-    {
-        T_FRAME_PICTURE picture;
-        picture.scene = &m_results.Scene();
-        picture.subtitle = m_results.TitleText();
-        if (m_results.Step() > 0) {
-            picture.subtitle +=
-                ", " + Say("IDS_QM_PLOT_PUSH_STEP", std::to_string(m_results.Step()));
-            picture.note = Say("IDS_QM_UI_SHAPE_NOTE",
-                               LocalNumberText(ShortestText(m_results.Scale())).toStdString(),
-                               picture.scene->lengthUnit);
-            picture.displacement = &m_results.Moves();
-            picture.scale = m_results.Scale();
-            if (!m_results.Marks().hinges.empty()) picture.marks = &m_results.Marks();
-        }
-        m_view->SetPicture(std::move(picture));
-    }
+    void Show() override { m_view->SetPicture(StatePicture(m_results, m_results.Scale())); }
 
 private:
     CPushOverHingeStateDlg& m_results;
