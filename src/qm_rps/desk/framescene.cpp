@@ -10,8 +10,6 @@ namespace {
 
 using S = T_SHAPE_SOURCE;
 
-constexpr double kShown = 0.05; // largest displacement on the picture over the frame's size
-
 double Length(const std::array<double, 3>& v)
 {
     return std::hypot(v[0], v[1], v[2]);

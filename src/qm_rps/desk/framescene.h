@@ -68,8 +68,10 @@ public:
     std::vector<T_SCENE_DRIFT> Drifts(const T_SHAPE_SOURCE& source, int step);
     /// The axis normal to a frame that lies in a plane of axes: 0 X, 1 Y, 2 Z; -1: none.
     static int FlatAxis(const T_FRAME_SCENE& scene);
-    /// A factor on the displacements, a round number, that makes the largest a twentieth of the
-    /// frame's size.
+    /// The largest displacement on a picture over the frame's size.
+    static constexpr double kShown = 0.05;
+    /// A factor on the displacements, a round number, that makes the largest at most kShown times
+    /// the frame's size.
     static double RoundScale(const T_FRAME_SCENE& scene,
                              const std::vector<std::array<double, 3>>& displacement);
     const std::string& Error() const { return m_error; }

@@ -79,8 +79,12 @@ QVariant CGridModel::data(const QModelIndex& at, int role) const
     case Qt::BackgroundRole: {
         const std::string mark =
             m_binding.mark ? m_binding.mark(Size(at.row()), Size(at.column())) : std::string();
-        if (role == Qt::ToolTipRole)
-            return mark.empty() ? QVariant() : QVariant(QString::fromStdString(mark));
+        if (role == Qt::ToolTipRole) {
+            constexpr qsizetype kLong = 40; // letters: a column may be too narrow for it
+            const QString text = at.data(Qt::DisplayRole).toString();
+            if (mark.empty()) return text.size() > kLong ? QVariant(text) : QVariant();
+            return QString::fromStdString(mark);
+        }
         const CELL_TONE tone =
             m_binding.tone ? m_binding.tone(Size(at.row()), Size(at.column())) : CELL_TONE::Plain;
         if (!mark.empty() || tone == CELL_TONE::Fault) return QColor(kMarked);

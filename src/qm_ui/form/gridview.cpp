@@ -63,7 +63,6 @@ CGridView::CGridView(T_GRID_BINDING binding, ChangedFn changed, QWidget* parent)
     });
     if (!edits) {
         setSelectionBehavior(SelectRows);
-        setSelectionMode(SingleSelection);
     }
     verticalHeader()->setSectionResizeMode(QHeaderView::Fixed);
     horizontalHeader()->setSectionResizeMode(QHeaderView::Interactive);
@@ -93,6 +92,15 @@ void CGridView::FitColumns()
     constexpr int kMeasured = 200; // columns of large tables are measured by their first rows
     horizontalHeader()->setResizeContentsPrecision(kMeasured);
     resizeColumnsToContents();
+    // One long text must not push the numbers of its column out of sight.
+    int widest = 0, total = 0;
+    for (int c = 0; c < m_model->columnCount(); ++c) {
+        total += columnWidth(c);
+        if (columnWidth(c) > columnWidth(widest)) widest = c;
+    }
+    const int room = viewport()->width(), others = total - columnWidth(widest);
+    if (total > room && columnWidth(widest) > room / 2)
+        setColumnWidth(widest, std::max(room - others, room / 2));
 }
 
 /// Tables on pages behind are measured when they come to the front.

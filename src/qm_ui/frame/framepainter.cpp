@@ -68,7 +68,8 @@ void DrawTriad(QPainter& painter, const QRectF& area, const T_AXES& axes)
 
 } // namespace
 
-/// Node places on the page. The frame without displacements fits at zoom 1.
+/// Node places on the page. The frame fits at zoom 1, with room for displacements of the size that
+/// a round scale gives them: the room is the same for all steps.
 void CFramePainter::PlaceDesign(const T_FRAME_PICTURE& picture, const T_CAMERA& camera,
                                 const QRectF& area)
 {
@@ -85,7 +86,10 @@ void CFramePainter::PlaceDesign(const T_FRAME_PICTURE& picture, const T_CAMERA& 
         low = std::min(low, y);
         high = std::max(high, y);
     }
-    const double w = std::max(right - left, 1e-12), h = std::max(high - low, 1e-12);
+    const double room = picture.displacement
+                            ? 2.0 * CFrameScene::kShown * std::hypot(right - left, high - low)
+                            : 0.0;
+    const double w = std::max(right - left + room, 1e-12), h = std::max(high - low + room, 1e-12);
     const double px = camera.zoom * std::min(std::max(area.width() - 2 * kMargin, 10.0) / w,
                                              std::max(area.height() - 2 * kMargin, 10.0) / h);
     const QPointF centre = area.center() + camera.pan;
