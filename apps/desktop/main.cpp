@@ -1,4 +1,5 @@
 #include "mainwindow.h"
+#include "pushtools.h"
 #include "qm_base/say.h"
 #include "qm_db/casefile.h"
 #include "qm_solver/libraryspace.h"
@@ -51,9 +52,11 @@ int main(int argc, char** argv)
     const QCommandLineOption examples("examples", "Folder of the example models for --pictures.",
                                       "folder", "examples");
     const QCommandLineOption startOnly("start-only", "Show the window and end: for benchmarks.");
+    const QCommandLineOption push("push",
+                                  "Push the model's load cases at once, and show the hinges.");
     const QCommandLineOption outside("allow-outside",
                                      "Read recorder files outside the case file's folder, too.");
-    parser.addOptions({pictures, examples, startOnly, outside});
+    parser.addOptions({pictures, examples, startOnly, push, outside});
     parser.process(app);
     CCaseFile::SetAllowOutside(parser.isSet(outside));
     if (parser.isSet(pictures))
@@ -62,8 +65,8 @@ int main(int argc, char** argv)
     window.show();
     if (parser.positionalArguments().isEmpty())
         (void)window.OfferRecovery();
-    else
-        (void)window.Open(parser.positionalArguments().first());
+    else if (window.Open(parser.positionalArguments().first()) && parser.isSet(push))
+        QTimer::singleShot(0, &window, [&window] { PushAtOnce(window.Desktop()); });
     if (parser.isSet(startOnly)) QTimer::singleShot(0, &app, &QApplication::quit);
     return QApplication::exec();
 }

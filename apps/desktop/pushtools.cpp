@@ -74,6 +74,15 @@ T_COMMANDS PushCommands(T_DESKTOP& desktop)
         {kMenu, "IDS_QM_UI_PUSH_STOREYS", "Ctrl+F8", Open<CPushOverStoreyDlg>(desktop), hasResult}};
 }
 
+void PushAtOnce(T_DESKTOP& desktop)
+{
+    CPushOverRunDlg dialog(desktop.doc);
+    dialog.m_atOnce = true;
+    dialog.SetView(&desktop.view);
+    (void)dialog.DoModal();
+    desktop.changed();
+}
+
 std::vector<T_WINDOW_EXAMPLE> PushWindowExamples()
 {
     constexpr const char* kFrame = "rc-frame-2-storey";

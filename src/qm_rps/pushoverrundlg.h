@@ -36,6 +36,8 @@ public:
 
     /// All load cases that can be pushed are chosen; those without control data are not listed.
     explicit CPushOverRunDlg(CDBDoc& doc);
+    bool m_atOnce = false; // its window pushes as it comes up, and shows the hinges in the end
+
     ~CPushOverRunDlg() override;
 
     std::size_t Cases() const { return m_cases.size(); }

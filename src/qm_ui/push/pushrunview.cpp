@@ -7,6 +7,8 @@
 #include "qm_ui/push/pushresultviews.h"
 #include "qm_ui/push/stepfield.h"
 
+#include <QTimer>
+
 namespace {
 
 using RUN = CPushOverRunDlg;
@@ -108,6 +110,12 @@ void BuildRun(CFormView& form, RUN& run)
     rows.name = "rows";
     rows.widget->setMinimumHeight(130);
     rows.widget->setMaximumHeight(220);
+    if (!run.m_atOnce) return;
+    QTimer::singleShot(0, form.Host(), [&form, &run] {
+        (void)run.OnRun();
+        form.Refresh();
+        if (!run.Runs().empty()) ShowResults<CPushOverHingeStateDlg>(run);
+    });
 }
 
 } // namespace
