@@ -1,7 +1,10 @@
 // The windows of the push, with real events.
 #include "windowplay.h"
 
+#include "pushoverwindow.h"
+#include "pushtools.h"
 #include "qm_db/editscope.h"
+#include "qm_rps/evaluatedsteps.h"
 #include "qm_rps/push/pushresultlist.h"
 #include "qm_ui/frame/frameview.h"
 
@@ -101,7 +104,7 @@ TEST_F(PushWindows, ALoadCaseIsPushedAndItsResultsAreThoseOfTheDocument)
     EXPECT_EQ(again.advice, run.advice);
 }
 
-TEST_F(PushWindows, ARunWaitsAndIsStoppedWithItsSteps)
+TEST_F(PushWindows, ARunWaitsHoldsTheModelAndIsStoppedWithItsSteps)
 {
     std::size_t paused = 0;
     const auto start = [](CDialogWindow& w) {
@@ -113,19 +116,129 @@ TEST_F(PushWindows, ARunWaitsAndIsStoppedWithItsSteps)
     };
     const auto stop = [&](CDialogWindow& w) {
         EXPECT_TRUE(Says(w, "waits"));
-        EXPECT_TRUE(m_main->Doc().Data().IsLocked());
+        EXPECT_FALSE(w.findChild<QPushButton*>("IDS_QM_UI_PUSH_RUN_START")->isEnabled());
         paused = Points(w);
-        w.reject(); // does not close: it stops the run
+        // Neither an edit nor the end of the program gets at the model meanwhile.
+        CDBDoc& doc = m_main->Doc();
+        const long revision = doc.Data().Revision();
+        T_POLC_D record = Model().pushovers.begin()->second;
+        record.steps = 7;
+        {
+            CEditScope edit(doc, "Change the steps");
+            EXPECT_FALSE(edit.Put(Model().pushovers.begin()->first, record) && edit.Commit());
+        }
+        EXPECT_EQ(revision, doc.Data().Revision());
+        m_main->close();
+        EXPECT_TRUE(m_main->isVisible());
+        w.close();
+        EXPECT_TRUE(w.isVisible());
+        EXPECT_EQ(paused, Points(w)) << "it goes on";
+        // Stopped twice: by the button, and by closing the window.
+        Press("IDS_QM_UI_PUSH_RUN_CANCEL")(w);
+        w.reject();
         EXPECT_TRUE(w.isVisible());
     };
+    m_main->show();
     CPlay play({{kRun, start}, {kRun, stop, isPaused}, {kRun, Cancel, HasEnded}});
     Run("IDS_QM_UI_PUSH_RUN");
     const T_PUSH_RUN run = Stored();
     EXPECT_TRUE(run.cancelled);
-    EXPECT_GE(run.displacement.size(), paused);
+    EXPECT_GE(run.displacement.size() + 1, paused); // the curve has the state before the push, too
     EXPECT_GE(run.displacement.size(), 1U);
     EXPECT_LT(run.displacement.size(), 108U);
     EXPECT_FALSE(m_main->Doc().Data().IsLocked());
+}
+
+TEST_F(PushWindows, StepsOfAnotherSolverAreReplacedOnlyWhenThePersonSaysSo)
+{
+    ASSERT_TRUE(Open("rc-frame-2-storey"));
+    CDBDoc& doc = m_main->Doc();
+    int ours = 0, theirs = 0;
+    ASSERT_TRUE(doc.Attr().FindPolc("PX_HINGES", ours) && doc.Attr().FindPolc("PX_MODE1", theirs));
+    T_POLC_D record = Model().pushovers.at(ours);
+    record.name = "PX_MODE1";
+    CEditScope edit(doc, "Push it, too");
+    ASSERT_TRUE(edit.Put(theirs, record) && edit.Commit());
+    for (const bool yes : {false, true}) {
+        const ACT look = [&](CDialogWindow& w) {
+            QAbstractItemModel& rows = Grid(w, "rows").Model();
+            ASSERT_EQ(2, rows.rowCount());
+            EXPECT_EQ("PX_MODE1", Cell(rows, 0, 0));
+            EXPECT_EQ(!yes, Cell(rows, 0, 1) == "not pushed");
+            EXPECT_EQ(!yes, Says(w, "steps of another solver are kept"));
+            EXPECT_EQ(yes ? "up to date" : "of another solver",
+                      Cell(Grid(w, "cases").Model(), 0, 2));
+            Cancel(w);
+        };
+        CPlay play({{kRun, Press("IDS_QM_UI_PUSH_RUN_START")}, {kRun, look, HasEnded}});
+        play.m_answer = yes ? QMessageBox::Yes : QMessageBox::No;
+        Run("IDS_QM_UI_PUSH_RUN");
+        EXPECT_EQ(1, play.m_texts.size());
+        EXPECT_TRUE(play.m_texts.join("").contains("PX_MODE1"));
+        EXPECT_NE(nullptr, doc.Post().RunOf(ours));
+        EXPECT_EQ(yes, doc.Post().RunOf(theirs) != nullptr);
+    }
+}
+
+TEST_F(PushWindows, TheHingesAtAPerformancePointAreOneClickFromTheEvaluation)
+{
+    ASSERT_TRUE(Open("masonry-wall"));
+    PushIt();
+    CDBDoc& doc = m_main->Doc();
+    const std::string name = "PX TRIANGLE NTC2018";
+    T_PUSH_EVALUATION found;
+    std::string error;
+    ASSERT_TRUE(EvaluateStored(doc, name, found, error)) << error;
+    // The push goes straight from vertex to vertex: at a demand it stands between its neighbours.
+    const T_PUSH_RUN run = Stored("PX TRIANGLE");
+    const auto shearAt = [&](double d) {
+        std::size_t i = 1;
+        while (run.displacement.at(i) < d)
+            ++i;
+        const double part =
+            (d - run.displacement[i - 1]) / (run.displacement[i] - run.displacement[i - 1]);
+        return run.baseReaction[i - 1] + part * (run.baseReaction[i] - run.baseReaction[i - 1]);
+    };
+    const ACT look = [&](CDialogWindow& w) {
+        auto* points = qobject_cast<QComboBox*>(Field(w, "point"));
+        ASSERT_NE(nullptr, points);
+        EXPECT_EQ("SLD: demand", points->currentText());
+        for (const T_LIMIT_ROW& row : found.limitStates) {
+            if (!row.demand) continue;
+            const int i = points->findText(QString::fromStdString(row.name + ": demand"));
+            ASSERT_GE(i, 0) << row.name;
+            ChooseIndex(points, i);
+            EXPECT_TRUE(Says(w, QString::fromStdString(row.name + ": demand, " + name)));
+            const T_PLOT& plot = Picture(w);
+            // An evaluation counts from the state before the push on.
+            const double total = *row.demand + plot.series.front().x.front();
+            EXPECT_NEAR(total, plot.series.back().x.front(), 1e-9);               // m
+            EXPECT_NEAR(shearAt(total) / 1e3, plot.series.back().y.front(), 0.2); // kN
+        }
+        Slide(w, 1);
+        EXPECT_EQ(-1, points->currentIndex());
+        w.reject();
+    };
+    CPlay play({{kStates, look}});
+    CPushOverWindow& window = CPushOverWindow::Show(m_main->Desktop());
+    ASSERT_TRUE(window.Model().OnOpen(name));
+    window.Form().Refresh();
+    Push(window, "hinges");
+    EXPECT_TRUE(play.m_texts.isEmpty());
+    EXPECT_EQ(2U, PushResultsOf(doc).size());
+    EXPECT_EQ(run.displacement, Stored("PX TRIANGLE").displacement) << "the results stay";
+}
+
+TEST_F(PushWindows, AtOnceTheModelIsPushedAndItsHingesShown)
+{
+    CPlay play({{kStates,
+                 [](CDialogWindow& w) {
+                     EXPECT_TRUE(Says(w, "Step 108 of 108"));
+                     w.reject();
+                 }},
+                {kRun, Cancel, HasEnded}});
+    PushAtOnce(m_main->Desktop());
+    EXPECT_EQ(108U, Stored().displacement.size());
 }
 
 TEST_F(PushWindows, HingesAreShownByStepAndChosenByAClickOnTheFrame)
