@@ -16,8 +16,9 @@ struct T_LINE_POINT {
 };
 using T_LINE = std::vector<T_LINE_POINT>;
 
-constexpr double kAside = 1e-9;  // of the range: how far the ends of an upright piece stand apart
-constexpr double kBeyond = 1e15; // N: no member comes there
+constexpr double kAside = 1e-9;    // of the range: how far the ends of an upright piece stand apart
+constexpr double kRounding = 1e-9; // of the largest moment: at its tips a line has none
+constexpr double kBeyond = 1e15;   // N: no member comes there
 
 /// The points of a curve P / Pmax, M / largest, whichever way they run.
 template <class POINTS>
@@ -25,7 +26,7 @@ T_LINE LineOf(const POINTS& points, double pMax)
 {
     T_LINE line;
     for (const T_PM_POINT& p : points)
-        line.push_back({-p.p * pMax, p.m});
+        line.push_back({-p.p * pMax, std::fabs(p.m) <= kRounding ? 0.0 : p.m});
     if (line.front().axial > line.back().axial) std::ranges::reverse(line);
     const double aside = kAside * (line.back().axial - line.front().axial);
     T_LINE out;
@@ -60,7 +61,10 @@ void Join(const T_SIDES<T_LINE>& lines, T_SIDES<double> factor,
         for (const T_LINE_POINT& p : *line)
             if (low <= p.axial && p.axial <= high) forces.push_back(p.axial);
     std::ranges::sort(forces);
-    forces.erase(std::ranges::unique(forces).begin(), forces.end());
+    // Forces that rounding sets apart would give a slope of its own between them.
+    const double same = 0.1 * kAside * (high - low);
+    const auto isSame = [same](double a, double b) { return b - a <= same; };
+    forces.erase(std::ranges::unique(forces, isSame).begin(), forces.end());
     for (const double n : forces)
         out.push_back({n, factor.pos * At(lines.pos, n), factor.neg * At(lines.neg, n)});
 }
