@@ -113,6 +113,35 @@ TEST_F(PushPoints, StandInTableAndReport)
     ExpectHolds(report, {"Storeys: displacement, drift, shear", "S2"});
 }
 
+// Pictures of a step name it, and count the hinges as the tables of the evaluation do.
+TEST_F(PushPoints, ArePicturesOfTheFrameAndItsStoreys)
+{
+    const json all = Evaluated(Frame(1.0), 0);
+    const json& demand = all[1].at("hinges_at").at(1); // SD
+    const struct {
+        const char* options;
+        json at;
+        const char* step;
+    } pictures[] = {{"--at A", all[0]["hinges_at"][0], "(performance point, A)"},
+                    {"--at E --state SD", demand, "(SD: demand, E)"}};
+    for (const auto& p : pictures) {
+        Done("push c.json --overwrite --plot-hinges h.svg --plot-storeys s.svg " +
+             std::string(p.options));
+        const std::string hinges = Text("h.svg"), storeys = Text("s.svg");
+        for (const char* state : {"elastic", "B-C"}) {
+            const std::string entry =
+                std::string(state) + ": " + std::to_string(p.at["states"][state].get<int>());
+            ExpectHolds(hinges, {entry.c_str(), p.step});
+        }
+        ExpectHolds(storeys, {"Displacement (m)", "Drift ratio", "Shear (kN)"});
+    }
+    Done("push c.json --overwrite --plot-hinges h.svg --step 1"); // elastic as yet
+    ExpectHolds(Text("h.svg"), {"P, Step 1<", "elastic: 14", "B-C: 0"});
+    ExpectRefused("push c.json --overwrite --plot-hinges h.svg --step 9999", 2, "no step 9999");
+    ExpectRefused("push c.json --overwrite --plot-hinges h.svg --at nobody", 2, "nobody");
+    ExpectRefused("push c.json --step 2", 2, "--plot-hinges");
+}
+
 TEST_F(PushPoints, AreStepsOfAPushByLoadToo)
 {
     const json expected =
