@@ -137,7 +137,9 @@ TEST_F(PushPoints, ArePicturesOfTheFrameAndItsStoreys)
     }
     Done("push c.json --overwrite --plot-hinges h.svg --step 1"); // elastic as yet
     ExpectHolds(Text("h.svg"), {"P, Step 1<", "elastic: 14", "B-C: 0"});
-    ExpectRefused("push c.json --overwrite --plot-hinges h.svg --step 9999", 2, "no step 9999");
+    const T_RUN beyond = Run("push c.json --overwrite --plot-hinges h.svg --step 9999");
+    EXPECT_EQ(2, beyond.code);
+    ExpectHolds(beyond.err, {"no step 9999", "20"});
     ExpectRefused("push c.json --overwrite --plot-hinges h.svg --at nobody", 2, "nobody");
     ExpectRefused("push c.json --step 2", 2, "--plot-hinges");
 }

@@ -8,6 +8,7 @@
 #include <QKeyEvent>
 #include <QLineEdit>
 #include <QLocale>
+#include <QScrollBar>
 #include <QStringList>
 #include <QStyledItemDelegate>
 
@@ -92,15 +93,28 @@ void CGridView::FitColumns()
     constexpr int kMeasured = 200; // columns of large tables are measured by their first rows
     horizontalHeader()->setResizeContentsPrecision(kMeasured);
     resizeColumnsToContents();
-    // One long text must not push the numbers of its column out of sight.
+    CapWidest();
+}
+
+/// One long text must not push the numbers of its column out of sight.
+void CGridView::CapWidest()
+{
     int widest = 0, total = 0;
     for (int c = 0; c < m_model->columnCount(); ++c) {
         total += columnWidth(c);
         if (columnWidth(c) > columnWidth(widest)) widest = c;
     }
-    const int room = viewport()->width(), others = total - columnWidth(widest);
+    const int bar = verticalScrollBar()->sizeHint().width(); // it may come up yet
+    const int room = std::min(viewport()->width(), maximumViewportSize().width() - bar);
+    const int others = total - columnWidth(widest);
     if (total > room && columnWidth(widest) > room / 2)
         setColumnWidth(widest, std::max(room - others, room / 2));
+}
+
+void CGridView::resizeEvent(QResizeEvent* event)
+{
+    QTableView::resizeEvent(event);
+    CapWidest();
 }
 
 /// Tables on pages behind are measured when they come to the front.

@@ -24,11 +24,13 @@ public:
 protected:
     void keyPressEvent(QKeyEvent* event) override;
     void showEvent(QShowEvent* event) override;
+    void resizeEvent(QResizeEvent* event) override;
 
 private:
     T_GRID_RANGE ChosenRange() const;
     int PasteCells(const QString& text, const T_GRID_RANGE& from);
     void FitColumns();
+    void CapWidest();
     void FollowChoice();
 
     CGridModel* m_model;
