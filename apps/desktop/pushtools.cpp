@@ -54,6 +54,17 @@ std::unique_ptr<DIALOG> Pushed(CDBDoc& doc, double part)
     return dialog;
 }
 
+/// The hinges at the demand of an evaluation.
+std::unique_ptr<CPushOverHingeStateDlg> AtPoint(CDBDoc& doc)
+{
+    auto dialog = Pushed<CPushOverHingeStateDlg>(doc, 1.0);
+    T_PUSH_EVALUATION evaluation;
+    std::string error;
+    if (EvaluateStored(doc, "PX EC8", evaluation, error))
+        (void)dialog->OnShowPoints(evaluation, {}, error);
+    return dialog;
+}
+
 } // namespace
 
 void RegisterPushViews(CViewFactory& factory)
@@ -98,6 +109,7 @@ std::vector<T_WINDOW_EXAMPLE> PushWindowExamples()
             Example<CPushOverHingeStateDlg>(
                 "push-states-space", "eccentric-building",
                 [](CDBDoc& doc) { return Pushed<CPushOverHingeStateDlg>(doc, 1.0); }),
+            Example<CPushOverHingeStateDlg>("push-states-point", "eccentric-building", AtPoint),
             Example<CPushOverStoreyDlg>("push-storeys", "steel-frame-2-storey", [](CDBDoc& doc) {
                 return Pushed<CPushOverStoreyDlg>(doc, 0.6);
             })};
