@@ -1,4 +1,5 @@
 // Results of a push as they are read back from a model file.
+#include "qm_db/editscope.h"
 #include "qm_rps/push/pushrun.h"
 #include "tempfolder.h"
 
