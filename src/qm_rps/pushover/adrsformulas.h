@@ -8,6 +8,10 @@
 /// it.
 inline constexpr double kFullLoopPct = 63.7;
 
+/// Forces, or displacements, of one curve that differ by less than this fraction of its largest one
+/// are equal: the rest is rounding of a push or of a change of units, and no step is chosen by it.
+inline constexpr double kSameOnCurve = 1e-9;
+
 /// Period of the radial line through a point: T = 2 pi sqrt(Sd / (Sa g)).
 inline double SecantPeriod(double Sd, double Sa, double gravity)
 {

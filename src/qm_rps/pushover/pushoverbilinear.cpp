@@ -1,5 +1,7 @@
 #include "qm_rps/pushover/pushoverbilinear.h"
 
+#include "qm_rps/pushover/adrsformulas.h"
+
 #include <algorithm>
 #include <cmath>
 
@@ -10,29 +12,31 @@ double At(double x, double x0, double y0, double x1, double y1)
     return x1 == x0 ? y1 : y0 + (y1 - y0) * (x - x0) / (x1 - x0);
 }
 
-/// Displacement where the curve first reaches a level, walking up from the origin.
-double FirstReach(const T_ADRS_VIEW& c, double level)
+/// Displacement at a level that the segment up to point i reaches: its end where it is flat.
+double DispAt(const T_ADRS_VIEW& c, std::size_t i, double level, double same)
+{
+    const double a = c.Sa[i - 1], b = c.Sa[i];
+    if (std::fabs(b - a) <= same) return c.Sd[i];
+    return At(std::clamp(level, std::min(a, b), std::max(a, b)), a, c.Sd[i - 1], b, c.Sd[i]);
+}
+
+/// Displacement where the curve first reaches a level, walking up from the origin. same: what
+/// forces may differ by and be equal.
+double FirstReach(const T_ADRS_VIEW& c, double level, double same)
 {
     for (std::size_t i = 1; i < c.Size(); ++i) {
-        if (c.Sa[i] >= level) return At(level, c.Sa[i - 1], c.Sd[i - 1], c.Sa[i], c.Sd[i]);
+        if (c.Sa[i] >= level - same) return DispAt(c, i, level, same);
     }
     return c.Sd.back();
 }
 
 /// Where the curve has fallen to a level after its peak, else its last point.
-T_CURVE_PLACE FirstFall(const T_ADRS_VIEW& c, std::size_t peak, double level)
+T_CURVE_PLACE FirstFall(const T_ADRS_VIEW& c, std::size_t peak, double level, double same)
 {
     for (std::size_t i = peak + 1; i < c.Size(); ++i) {
-        if (c.Sa[i] <= level)
-            return {i - 1, At(level, c.Sa[i - 1], c.Sd[i - 1], c.Sa[i], c.Sd[i]), level};
+        if (c.Sa[i] <= level + same) return {i - 1, DispAt(c, i, level, same), level};
     }
     return PlaceAt(c, c.Size() - 1);
-}
-
-std::size_t FirstMaximumOf(std::span<const double> values)
-{
-    return static_cast<std::size_t>(std::max_element(values.begin(), values.end()) -
-                                    values.begin());
 }
 
 } // namespace
@@ -43,9 +47,13 @@ T_BILINEAR_OPTIONS BilinearDefaults(BILINEAR_RULE rule)
     return {rule, 0.6, 0.85, false};
 }
 
-std::size_t FirstMaximum(const std::vector<double>& Sa)
+std::size_t FirstMaximum(std::span<const double> V)
 {
-    return FirstMaximumOf(Sa);
+    if (V.empty()) return 0;
+    const double largest = *std::ranges::max_element(V);
+    const double least = largest - kSameOnCurve * std::fabs(largest);
+    return static_cast<std::size_t>(std::ranges::find_if(V, [=](double v) { return v >= least; }) -
+                                    V.begin());
 }
 
 T_CURVE_PLACE PlaceAt(const T_ADRS_VIEW& c, std::size_t point)
@@ -89,12 +97,12 @@ int CalcBilinearEc8(const T_ADRS_VIEW& curve, const T_CURVE_PLACE& dm, bool peak
 
 int CalcBilinearNtc(const T_ADRS_VIEW& curve, const T_BILINEAR_OPTIONS& options, T_BILINEAR& out)
 {
-    const std::size_t peak = FirstMaximumOf(curve.Sa);
-    const double Fbu = curve.Sa[peak];
-    const double reach = FirstReach(curve, options.secant * Fbu);
+    const std::size_t peak = FirstMaximum(curve.Sa);
+    const double Fbu = curve.Sa[peak], same = kSameOnCurve * Fbu;
+    const double reach = FirstReach(curve, options.secant * Fbu, same);
     if (!(Fbu > 0.0) || !(reach > 0.0)) return 0;
     const double k = options.secant * Fbu / reach;
-    const T_CURVE_PLACE end = FirstFall(curve, peak, options.drop * Fbu);
+    const T_CURVE_PLACE end = FirstFall(curve, peak, options.drop * Fbu, same);
     const double du = end.Sd;
     const double root = du * du - 2.0 * AreaTo(curve, end) / k;
     const double ay = options.peak || root < 0.0 ? Fbu : k * (du - std::sqrt(root));

@@ -3,6 +3,8 @@
 
 #include "qm_rps/pushover/pushoverperfptrecord.h"
 
+#include <span>
+
 enum class BILINEAR_RULE { Ec8, Ntc, Masonry };
 
 struct T_BILINEAR_OPTIONS {
@@ -27,8 +29,9 @@ inline auto Numbers(const T_BILINEAR& b)
 /// Defaults of a rule: ntc 0.6 and 0.85 (NTC C7.3.4.2), masonry 0.7 and 0.8 (C7.8.1.6).
 T_BILINEAR_OPTIONS BilinearDefaults(BILINEAR_RULE rule);
 
-/// Index of the first global maximum of the accelerations.
-std::size_t FirstMaximum(const std::vector<double>& Sa);
+/// Index of the first maximum of the forces of a curve, that of a plateau being its first point:
+/// nothing later is higher by more than rounding (kSameOnCurve).
+std::size_t FirstMaximum(std::span<const double> V);
 
 /// Sa on a curve at d: of the first segment that holds d, the last ordinate beyond the curve.
 double CurveAccelAt(const T_ADRS_VIEW& curve, double d);

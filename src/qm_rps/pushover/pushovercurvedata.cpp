@@ -3,6 +3,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_db/recordfacts.h"
 #include "qm_db/storyload.h"
+#include "qm_rps/pushover/adrsformulas.h"
 
 #include <algorithm>
 #include <cmath>
@@ -308,7 +309,8 @@ int CPushOverCurveData::AppendStep(int step)
     force = std::fabs(force);
     displacement = std::fabs(displacement);
     TransformByPlotType(m_plotType, displacement, force);
-    if (!m_decreasingStep && m_steps.size() > 1 && displacement < m_x.back())
+    if (!m_decreasingStep && m_steps.size() > 1 &&
+        displacement < m_x.back() * (1.0 - kSameOnCurve))
         m_decreasingStep = step;
     m_maxX = std::max(m_maxX, displacement);
     m_maxY = std::max(m_maxY, force);

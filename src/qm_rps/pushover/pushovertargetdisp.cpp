@@ -3,6 +3,7 @@
 #include "qm_db/compfunc.h"
 #include "qm_rps/pushover/adrsformulas.h"
 
+#include <algorithm>
 #include <cmath>
 #include <numbers>
 
@@ -83,15 +84,6 @@ std::vector<int> FindNearestSteps(std::span<const double> d, std::span<const dou
     return steps;
 }
 
-int FindPeakStep(std::span<const double> V)
-{
-    std::size_t peak = 0;
-    for (std::size_t i = 1; i < V.size(); ++i) {
-        if (V[i] > V[peak]) peak = i;
-    }
-    return static_cast<int>(peak);
-}
-
 std::optional<int> FindDriftStep(int peak, int last, double limit, const T_DRIFT_OF_STEP& drift)
 {
     const auto atPeak = drift(peak);
@@ -130,9 +122,11 @@ std::optional<T_LEVEL_CROSSING> FindStrengthDrop(std::span<const double> d,
 
 double FindRise(std::span<const double> d, std::span<const double> V, double level)
 {
+    const double same = V.empty() ? 0.0 : kSameOnCurve * std::fabs(*std::ranges::max_element(V));
     for (std::size_t k = 1; k < d.size(); ++k) {
-        if (V[k - 1] <= level && level < V[k])
-            return d[k - 1] + (d[k] - d[k - 1]) / (V[k] - V[k - 1]) * (level - V[k - 1]);
+        if (V[k - 1] <= level + same && level + same < V[k])
+            return d[k - 1] +
+                   (d[k] - d[k - 1]) / (V[k] - V[k - 1]) * std::max(level - V[k - 1], 0.0);
     }
     return 0.0;
 }

@@ -49,9 +49,6 @@ std::vector<int> FindNearestSteps(std::span<const double> d, std::span<const dou
 /// Storey drift ratio of a step; empty where there is none.
 using T_DRIFT_OF_STEP = std::function<std::optional<double>(int step)>;
 
-/// First step, from 1, with a force strictly above all before it.
-int FindPeakStep(std::span<const double> V);
-
 /// Step up to the peak whose drift is nearest to a limit; the peak itself where its drift is
 /// within the limit; `last` where no drift is nearer to the limit than 1. Empty where drifts are
 /// missing.
@@ -67,7 +64,8 @@ std::optional<T_LEVEL_CROSSING> FindStrengthDrop(std::span<const double> d,
                                                  std::span<const double> V, int peak, double level,
                                                  double dMin);
 
-/// Displacement at which the force first rises through a level; 0 where it never does.
+/// Displacement at which the force first rises through a level, by more than rounding
+/// (kSameOnCurve); 0 where it never does.
 double FindRise(std::span<const double> d, std::span<const double> V, double level);
 
 /// Displacement at which the behaviour factor reaches q on the bilinear curve.

@@ -179,7 +179,7 @@ int CPushOverTargetEvaluation::UpdateTargetDispDataCapacity()
     if (!m_bilinear) return 0;
     const auto& [d, V] = m_in.capacity;
     const int last = static_cast<int>(d.size()) - 1;
-    const int peak = FindPeakStep(V);
+    const int peak = static_cast<int>(FirstMaximum(V));
     const std::optional<int> driftStep = FindDriftStep(peak, last, kDamageDrift, m_in.drift);
     const int dlStep = driftStep.value_or(last);
     const double dl = d[static_cast<std::size_t>(dlStep)];
@@ -233,8 +233,8 @@ int CPushOverTargetEvaluation::UpdateTargetDispDataNTC(PUSH_METHOD code)
     FinishOutcome();
 
     const int last = static_cast<int>(m_in.capacity.Sd.size()) - 1;
-    const auto driftStep =
-        FindDriftStep(FindPeakStep(m_in.capacity.Sa), last, kSldDrift, m_in.drift);
+    const auto peak = static_cast<int>(FirstMaximum(m_in.capacity.Sa));
+    const auto driftStep = FindDriftStep(peak, last, kSldDrift, m_in.drift);
     if (driftStep) m_rows[1].capacityStep = m_rows[2].capacityStep = *driftStep;
     for (const std::size_t row : {0U, 1U}) // both follow from the drift
         if (!driftStep && m_rows[row].demand) m_rows[row].remark = kNotChecked;

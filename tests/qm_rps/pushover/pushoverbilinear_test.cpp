@@ -32,6 +32,8 @@ int Ec8(const T_ADRS_CURVE& curve, double dm, T_BILINEAR& out, bool peak = false
 }
 
 /// Yield point of the ntc rule from stiffness, ultimate displacement and area done by hand.
+constexpr double kLess = 1.0 - 1e-15; // what a push or a change of units leaves of 1
+
 T_BILINEAR Ntc(double k, double du, double E)
 {
     const double ay = k * (du - std::sqrt(du * du - 2.0 * E / k));
@@ -60,6 +62,14 @@ const T_FIT kFits[] = {
     // 0.18 is first reached at 0.01: k = 18; area 0.0009 + 0.0018 + 0.0024 + 0.006.
     { "ntc, level plateau", {{0, 0.01, 0.02, 0.03, 0.05}, {0, 0.18, 0.18, 0.3, 0.3}}, kNtc, 0.0,
       Ntc(18, 0.05, 0.0111) },
+    // A plateau that rounding puts below the level of the stiffness still reaches it, and one above
+    // the level of the fall has fallen to it: k = 10, area 0.002 + 0.004 + 0.00185.
+    { "ntc, plateau below level",
+      {{0, 0.01, 0.02, 0.03, 0.05}, {0, kLess * 0.18, kLess * 0.18, 0.3, 0.3}},
+      kNtc, 0.0, Ntc(18, 0.05, 0.0111) },
+    { "ntc, plateau above level",
+      {{0, 0.02, 0.04, 0.05, 0.08}, {0, 0.2, 0.2, 0.17 / kLess, 0.17 / kLess}},
+      kNtc, 0.0, Ntc(10, 0.05, 0.00785) },
     // The energy is that up to the peak, 0.4 + 3.6: what the curve does behind it does not count.
     { "ec8, steps back behind",    kBack, kEc8, 0.1, {0.04, 50, 0.14, 50} },
     // Falls to 42.5 at 0.09, stepping back; area 4 - 0.01 (50 + 42.5)/2; 30 at 0.015.

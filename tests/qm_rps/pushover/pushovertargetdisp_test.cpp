@@ -155,5 +155,6 @@ TEST(TargetDisp, FirstRiseThroughALevel)
     EXPECT_DOUBLE_EQ(2.0 + 2.0 / 3.0, FindRise(d, V, 2.0)); // reaching it is not passing it
     EXPECT_DOUBLE_EQ(0.5, FindRise(d, V, 0.0));             // at the first point
     EXPECT_EQ(0.0, FindRise(d, V, 4.0));
+    EXPECT_NEAR(2.0, FindRise(d, std::array{1.0, 2.0 + 1e-15, 2.0 - 1e-15, 4.0}, 2.0), 1e-12);
     EXPECT_EQ(0.0, FindRise(d, std::array{3.0, 4.0, 5.0, 6.0}, 1.0)); // starts above
 }

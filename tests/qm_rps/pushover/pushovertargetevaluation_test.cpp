@@ -158,6 +158,27 @@ TEST(TargetEvaluation, NtcCapacitiesOfBothCodesByHand)
     EXPECT_EQ(1, e.Rows()[2].capacityStep);
 }
 
+// The plateau from step 2 to 3 is flat but for the last digits: the drift at its first step is
+// within the limits, so that the capacity is 0.02 there; step 3, within them too, is at 0.04.
+TEST(TargetEvaluation, OnAPlateauTheFirstPeakCounts)
+{
+    for (const double last : {0.2, std::nextafter(0.2, 1.0), 0.2 * (1.0 + 2e-14)}) {
+        const std::vector<double> drifts{0, 0.001, 0.0015, 0.0028, 0.01, 0.02, 0.03};
+        T_TARGET_INPUT in = Input(BILINEAR_RULE::Masonry, drifts);
+        in.capacity.Sa[3] = last;
+        in.spectra.fill(Constant(0.1, 0.1));
+        CPushOverTargetEvaluation masonry(in);
+        ASSERT_EQ(1, masonry.UpdateTargetDispDataMasonry());
+        EXPECT_EQ(2, masonry.Rows()[0].capacityStep) << last - 0.2;
+        EXPECT_NEAR(kGamma * 0.02, masonry.Rows()[0].capacity.value(), 1e-15) << last - 0.2;
+        in.options = BilinearDefaults(BILINEAR_RULE::Ntc);
+        CPushOverTargetEvaluation ntc(in);
+        ASSERT_EQ(1, ntc.UpdateTargetDispDataNTC(PUSH_METHOD::Ntc2008));
+        EXPECT_NEAR(kGamma * 0.02, ntc.Rows()[1].capacity.value(), 1e-15) << last - 0.2;
+        EXPECT_NEAR(10 * ntc.Bilinear()->dy, kAyNtc, 1e-12) << last - 0.2;
+    }
+}
+
 // Hardening curve: 0.75 of the peak is reached at 0.0325, after the yield point dy = ay/20 of
 // k = 20, du = 0.1, area 0.0235.
 TEST(TargetEvaluation, Ntc2018TakesTheSmallerOfRiseAndYield)

@@ -268,11 +268,9 @@ std::string PushoverCurveText(const T_PUSH_EVALUATION& e)
     s += dashes;
     if (!c.y.empty()) {
         const auto lowest = std::min_element(c.y.begin(), c.y.end());
-        const auto highest = std::max_element(c.y.begin(), c.y.end());
         s += Extreme("IDS_RPS_PUSHOVER_Min___20_5e_at___20_5e__n", c,
                      static_cast<std::size_t>(lowest - c.y.begin()));
-        s += Extreme("IDS_RPS_PUSHOVER_Max___20_5e_at___20_5e__n", c,
-                     static_cast<std::size_t>(highest - c.y.begin()));
+        s += Extreme("IDS_RPS_PUSHOVER_Max___20_5e_at___20_5e__n", c, FirstMaximum(c.y));
     }
     return s + "\n\n";
 }
