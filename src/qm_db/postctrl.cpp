@@ -1,5 +1,6 @@
 #include "qm_db/postctrl.h"
 
+#include "qm_db/records/evalnames.h"
 #include "qm_db/storyload.h"
 
 #include <algorithm>
@@ -140,11 +141,11 @@ int CPostCtrl::Direction() const
 
 T_DIM CPostCtrl::DispDim() const
 {
-    return Direction() < 3 ? kDimLength : kDimNone;
+    return DisplacementDim(Direction() + 1);
 }
 T_DIM CPostCtrl::ReacDim() const
 {
-    return Direction() < 3 ? kDimForce : kDimMoment;
+    return ReactionDim(Direction() + 1);
 }
 
 int CPostCtrl::SelectPushover(int loadCase, int turn)

@@ -230,7 +230,8 @@ std::vector<double> StepsOfEvaluations(CDBDoc& doc, std::span<const T_PUSH_RUN> 
         const T_PUSH_EVALUATION& result = evaluator.Result();
         const T_WAY way = WayOf(*stored, record.controlNode);
         const auto add = [&](double d) {
-            const double si = way.At(ToSi(d, doc.Unit().Units(), kDimLength));
+            const double si =
+                way.At(ToSi(d, doc.Unit().Units(), DisplacementDim(record.direction)));
             if (si != 0.0 && IsOnTheWay(record, si) && !IsStep(runs, si)) out.push_back(si);
         };
         if (result.point) add(result.point->D);

@@ -5,6 +5,7 @@
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
 #include "qm_db/recordfacts.h"
+#include "qm_rps/push/pushquantity.h"
 
 #include <cstdio>
 #include <unistd.h>
@@ -12,12 +13,12 @@
 namespace {
 
 /// Shows the step, where somebody looks at it; false: Ctrl-C.
-bool ShowStep(const T_PUSH_PROGRESS& p, const T_UNITS& units)
+bool ShowStep(const T_PUSH_PROGRESS& p, const T_PUSH_QUANTITY& displacement)
 {
     if (isatty(STDERR_FILENO))
         ShowOnTerminal(Say("IDS_QM_CLI_PUSHING", p.name, std::to_string(p.done),
                            std::to_string(p.total),
-                           FormatText("%.4g", FromSi(p.displacement, units, kDimLength))),
+                           FormatText("%.4g", displacement.Shown(p.displacement))),
                        p.done >= p.total);
     return !CInterrupt::IsAsked();
 }
@@ -25,7 +26,8 @@ bool ShowStep(const T_PUSH_PROGRESS& p, const T_UNITS& units)
 EXIT_CODE PushOne(CDBDoc& doc, const std::string& file, CPushRun& push, int key,
                   std::vector<T_PUSH_RUN>& out)
 {
-    const PUSH_PROGRESS_FN progress = ProgressOnTerminal(doc);
+    const int direction = doc.Data().Model().pushovers.at(key).direction;
+    const PUSH_PROGRESS_FN progress = ProgressOnTerminal(doc, direction);
     std::vector<T_PUSH_RUN> runs;
     std::string error;
     if (!push.Run(key, progress, runs, error))
@@ -46,9 +48,11 @@ EXIT_CODE PushOne(CDBDoc& doc, const std::string& file, CPushRun& push, int key,
 
 } // namespace
 
-PUSH_PROGRESS_FN ProgressOnTerminal(CDBDoc& doc)
+PUSH_PROGRESS_FN ProgressOnTerminal(CDBDoc& doc, int direction)
 {
-    return [units = doc.Unit().Units()](const T_PUSH_PROGRESS& p) { return ShowStep(p, units); };
+    const T_PUSH_QUANTITY displacement =
+        DisplacementIn(static_cast<std::size_t>(direction - 1), doc.Unit().Units());
+    return [displacement](const T_PUSH_PROGRESS& p) { return ShowStep(p, displacement); };
 }
 
 EXIT_CODE PushCases(CDBDoc& doc, const std::string& file, const std::vector<int>& keys,

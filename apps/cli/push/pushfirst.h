@@ -18,7 +18,8 @@ EXIT_CODE PushCases(CDBDoc& doc, const std::string& file, const std::vector<int>
 EXIT_CODE PushWhereMissing(CDBDoc& doc, const std::string& file, const std::set<int>& keys);
 
 /// Shows the steps where somebody looks at them; Ctrl-C asks to stop while a CInterrupt lives.
-PUSH_PROGRESS_FN ProgressOnTerminal(CDBDoc& doc);
+/// direction: 1 to 6, of control; a translation where nothing else is said.
+PUSH_PROGRESS_FN ProgressOnTerminal(CDBDoc& doc, int direction = 1);
 
 /// What the hinges do at the points of these evaluations, with progress on a terminal; Ctrl-C ends
 /// it, the evaluations stand.

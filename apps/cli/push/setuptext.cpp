@@ -3,6 +3,7 @@
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
 #include "qm_db/recordfacts.h"
+#include "qm_rps/push/pushquantity.h"
 #include "qm_rps/push/stopwarnings.h"
 #include "qm_rps/pushover/loadcaserows.h"
 #include "json/jsontext.h"
@@ -86,10 +87,7 @@ private:
 
 class CSetupTable {
 public:
-    explicit CSetupTable(CDBDoc& doc)
-        : m_model(doc.Data().Model()), m_length(NameOf(doc.Unit().Units().length))
-    {
-    }
+    explicit CSetupTable(CDBDoc& doc) : m_model(doc.Data().Model()), m_units(doc.Unit().Units()) {}
 
     std::string Print(CDBDoc& doc, const std::vector<int>& cases)
     {
@@ -113,7 +111,12 @@ public:
     }
 
 private:
-    std::string Length(double value) const { return ShortestText(value) + " " + m_length; }
+    /// A displacement of the load case's control.
+    std::string Displacement(const T_POLC_D& record, double value) const
+    {
+        const auto direction = static_cast<std::size_t>(std::max(record.direction, 1) - 1);
+        return ShortestText(value) + " " + DisplacementIn(direction, m_units).Unit();
+    }
     std::string None() const { return Say("IDS_QM_CLI_SETUP_NONE"); }
 
     /// What a load case may have of its own.
@@ -147,9 +150,9 @@ private:
         const bool byDisplacement = c.incrementMethod == kByDisplacement;
         m_table.Row("IDS_QM_UI_POLC_METHOD", kIncrementNames[byDisplacement ? 1 : 0]);
         if (byDisplacement && c.masterNodeControl)
-            m_table.Row("IDS_QM_UI_POLC_MASTER", Length(c.masterMaxDispl));
+            m_table.Row("IDS_QM_UI_POLC_MASTER", Displacement(record, c.masterMaxDispl));
         else if (byDisplacement)
-            m_table.Row("IDS_QM_UI_POLC_TRANS", Length(c.maxTransDispl));
+            m_table.Row("IDS_QM_UI_POLC_TRANS", Displacement(record, c.maxTransDispl));
         if (FollowsFunction(record))
             m_table.Row("IDS_QM_UI_POLC_FUNCTION",
                         NameIn(m_model.incrementFunctions, c.incrementFunction));
@@ -187,14 +190,15 @@ private:
         AddShared(PushControlOf(m_model, record), &record);
         AddStops(record.stops);
         if (!record.additionalDisplacements.empty())
-            m_table.Row("IDS_QM_UI_POLC_ADDITIONAL", Joined(record.additionalDisplacements, {},
-                                                            [&](double d) { return Length(d); }));
+            m_table.Row("IDS_QM_UI_POLC_ADDITIONAL",
+                        Joined(record.additionalDisplacements, {},
+                               [&](double d) { return Displacement(record, d); }));
         if (record.additionalEvaluations)
             m_table.Row("IDS_QM_UI_POLC_EVALUATIONS", Say("IDS_QM_CLI_HINGE_ON"));
     }
 
     const T_MODEL& m_model;
-    std::string m_length;
+    T_UNITS m_units;
     CTable m_table;
 };
 

@@ -1,5 +1,5 @@
 // Names of the case file for units, pushover analysis, spectra and evaluations, in the order of
-// their numbers.
+// their numbers, and what the directions of a load case are measured in.
 #pragma once
 
 #include "qm_db/records.h"
@@ -30,3 +30,13 @@ inline constexpr int kFirstMethod = static_cast<int>(PUSH_METHOD::Fema440);
 inline constexpr std::array<const char*, 3> kProcedures{"A", "B", "C"};
 inline constexpr std::array<const char*, 3> kBilinearRules{"ec8", "ntc", "masonry"};
 inline constexpr std::array<const char*, 2> kStrengthRules{"rule", "peak"};
+
+/// Dimension of the displacements and of the base reactions of a load case (direction 1 to 6).
+inline constexpr T_DIM DisplacementDim(int direction)
+{
+    return direction <= 3 ? kDimLength : kDimNone; // a rotation is in radians
+}
+inline constexpr T_DIM ReactionDim(int direction)
+{
+    return direction <= 3 ? kDimForce : kDimMoment;
+}

@@ -49,7 +49,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_POLC_PATTERN> r)
 }
 
 template <class V>
-void CaseFields(V& v, T_FIELD_REF<V, T_POLC_CONTROL> r)
+void CaseFields(V& v, T_FIELD_REF<V, T_POLC_CONTROL> r, const T_DIM& displacement)
 {
     static const T_POLC_CONTROL d;
     v.Code("increment_method", r.incrementMethod, kIncrementNames, "IDS_QM_CHOICE_INCREMENT");
@@ -59,8 +59,8 @@ void CaseFields(V& v, T_FIELD_REF<V, T_POLC_CONTROL> r)
     v.Opt("generate_static_angle", r.generateStaticAngle, d.generateStaticAngle);
     v.Opt("static_angle", r.staticAngle, d.staticAngle);
     v.Opt("master_node_control", r.masterNodeControl, d.masterNodeControl);
-    v.Opt("master_max_displ", r.masterMaxDispl, d.masterMaxDispl, kDimLength);
-    v.Opt("max_trans_displ", r.maxTransDispl, d.maxTransDispl, kDimLength);
+    v.Opt("master_max_displ", r.masterMaxDispl, d.masterMaxDispl, displacement);
+    v.Opt("max_trans_displ", r.maxTransDispl, d.maxTransDispl, displacement);
 }
 
 /// A case file has them in "steps" where no results of another solver stand there.
@@ -76,7 +76,8 @@ void CaseFields(V& v, T_FIELD_REF<V, T_POLC_D> r)
         pattern.Opt("modes", r.modes, {});
     });
     v.List("patterns", r.patterns);
-    v.PartIf("control", r.control);
+    const T_DIM displacement = DisplacementDim(r.direction); // read before
+    v.PartIf("control", r.control, displacement);
     v.Opt("control_option", r.controlOption, 1);
     v.ListIf("initial_loads", r.initialLoads);
     v.OptNameRef("initial_case", r.initialCase, KindOf<T_POLC_D>());
@@ -85,7 +86,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_POLC_D> r)
     v.EnumIf("on_failure", r.onFailure, kPushFailureNames, "IDS_QM_CHOICE_FAILURE");
     v.Part("stops", r.stops);
     v.Opt("eccentricity", r.eccentricity, 0.0);
-    v.Opt("additional_displacements", r.additionalDisplacements, {}, kDimLength);
+    v.Opt("additional_displacements", r.additionalDisplacements, {}, displacement);
     v.Opt("additional_evaluations", r.additionalEvaluations, false);
 }
 

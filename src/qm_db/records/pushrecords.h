@@ -64,8 +64,8 @@ struct T_POLC_CONTROL {
     bool generateStaticAngle = false;
     double staticAngle = 0.0; // degrees
     bool masterNodeControl = true;
-    double masterMaxDispl = 0.0; // of the master node, length; sign gives the direction
-    double maxTransDispl = 0.0;  // largest translation of any node, length
+    double masterMaxDispl = 0.0; // of the master node; sign gives the direction
+    double maxTransDispl = 0.0;  // largest one of any node; both are rad where RX to RZ control
     bool operator==(const T_POLC_CONTROL&) const = default;
 };
 
@@ -97,7 +97,7 @@ struct T_POLC_D {
     T_PUSH_STOPS_D stops{};
     double eccentricity = 0.0; // of the loads: fraction of the storey's extent normal to the push
     std::vector<double>
-        additionalDisplacements{};      // of the control node, length: steps of their own
+        additionalDisplacements{};      // of the control node (or rad): steps of their own
     bool additionalEvaluations = false; // likewise at the performance points of evaluations
     bool operator==(const T_POLC_D&) const = default;
 };

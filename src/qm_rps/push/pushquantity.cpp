@@ -1,6 +1,7 @@
 #include "qm_rps/push/pushquantity.h"
 
 #include "qm_base/say.h"
+#include "qm_db/recordfacts.h"
 
 std::string T_PUSH_QUANTITY::Unit() const
 {
@@ -17,12 +18,12 @@ std::string T_PUSH_QUANTITY::Head(const char* key) const
 
 T_PUSH_QUANTITY DisplacementIn(std::size_t direction, const T_UNITS& units)
 {
-    return {direction < 3 ? kDimLength : kDimNone, units};
+    return {DisplacementDim(static_cast<int>(direction) + 1), units};
 }
 
 T_PUSH_QUANTITY ReactionIn(std::size_t direction, const T_UNITS& units)
 {
-    return {direction < 3 ? kDimForce : kDimMoment, units};
+    return {ReactionDim(static_cast<int>(direction) + 1), units};
 }
 
 T_PUSH_QUANTITY DeformationOf(HINGE_COMPONENT component, const T_UNITS& units)

@@ -309,8 +309,7 @@ int CPushOverCurveData::AppendStep(int step)
     force = std::fabs(force);
     displacement = std::fabs(displacement);
     TransformByPlotType(m_plotType, displacement, force);
-    if (!m_decreasingStep && m_steps.size() > 1 &&
-        displacement < m_x.back() * (1.0 - kSameOnCurve))
+    if (!m_decreasingStep && m_steps.size() > 1 && displacement < m_x.back() * (1.0 - kSameOnCurve))
         m_decreasingStep = step;
     m_maxX = std::max(m_maxX, displacement);
     m_maxY = std::max(m_maxY, force);

@@ -1,7 +1,6 @@
 #include "qm_ui/loadcase/loadcasepages.h"
 
 #include "qm_base/msgfunction.h"
-#include "qm_rps/dialog/unithead.h"
 #include "qm_rps/po_loadcasedlg.h"
 #include "qm_rps/push/pushlists.h"
 #include "qm_ui/push/pushsetupviews.h"
@@ -65,10 +64,7 @@ T_GRID_BINDING AdditionalGrid(D& d)
 {
     std::vector<double>& list = d.m_case.additionalDisplacements;
     T_GRID_BINDING grid;
-    grid.columns = {{[&d] {
-                         return HeadWithUnit("IDS_QM_UI_POLC_ADDITIONAL", kDimLength,
-                                             d.Doc() ? d.Doc()->Unit().Units() : T_UNITS());
-                     },
+    grid.columns = {{[&d] { return LoadCaseDisplacement(d).Head("IDS_QM_UI_POLC_ADDITIONAL"); },
                      CELL_KIND::Number, true}};
     grid.rows = [&list] { return list.size() + 1; };
     grid.text = [&list](std::size_t row, std::size_t) { return ListNumberText(list, row); };
@@ -82,6 +78,12 @@ T_GRID_BINDING AdditionalGrid(D& d)
 }
 
 } // namespace
+
+T_PUSH_QUANTITY LoadCaseDisplacement(const D& d)
+{
+    return DisplacementIn(static_cast<std::size_t>(std::max(d.m_case.direction, 1) - 1),
+                          d.Doc() ? d.Doc()->Unit().Units() : T_UNITS());
+}
 
 void BuildLoadCaseStart(CFormView& form, D& d)
 {

@@ -2,7 +2,6 @@
 
 #include "qm_base/textformat.h"
 #include "qm_db/recordfacts.h"
-#include "qm_rps/dialog/unithead.h"
 #include "qm_rps/po_loadcasedlg.h"
 #include "qm_rps/po_loadcaselistdlg.h"
 #include "qm_rps/po_selectloadcasedlg.h"
@@ -53,11 +52,9 @@ std::function<std::vector<std::string>()> Directions(std::size_t count)
 }
 
 /// With the unit in the caption, which is hidden with its field.
-TextFn LengthCaption(const D& d, const char* key)
+TextFn DisplacementCaption(const D& d, const char* key)
 {
-    return [&d, key] {
-        return HeadWithUnit(key, kDimLength, d.Doc() ? d.Doc()->Unit().Units() : T_UNITS());
-    };
+    return [&d, key] { return LoadCaseDisplacement(d).Head(key); };
 }
 
 /// What both methods have.
@@ -102,12 +99,12 @@ void BuildDisplacement(CFormView& form, D& d)
     on.name = "masterOn";
     on.shown = [&d] { return ByDisplacement(d); };
     const auto isMaster = [&d] { return HasControl(d) && d.m_case.control->masterNodeControl; };
-    CFormField& master = form.Number(LengthCaption(d, "IDS_QM_UI_POLC_MASTER"),
+    CFormField& master = form.Number(DisplacementCaption(d, "IDS_QM_UI_POLC_MASTER"),
                                      Control(d, &T_POLC_CONTROL::masterMaxDispl));
     master.name = "control.masterMaxDispl";
     master.shown = [&d] { return ByDisplacement(d); };
     master.enabled = isMaster;
-    CFormField& trans = form.Number(LengthCaption(d, "IDS_QM_UI_POLC_TRANS"),
+    CFormField& trans = form.Number(DisplacementCaption(d, "IDS_QM_UI_POLC_TRANS"),
                                     Control(d, &T_POLC_CONTROL::maxTransDispl));
     trans.name = "control.maxTransDispl";
     trans.shown = [&d] { return ByDisplacement(d); };

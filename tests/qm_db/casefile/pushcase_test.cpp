@@ -60,6 +60,22 @@ TEST(PushCase, ReadsEveryMemberIntoItsField)
     EXPECT_EQ(own, PushControlOf(m, m.pushovers.at(2)));
 }
 
+// A rotation that is controlled is in rad whatever the units; those of the file are kips and in.
+TEST(PushCase, ControlByARotationIsInRadians)
+{
+    std::string text = AllText();
+    const std::size_t at = text.find("\"direction\"");
+    ASSERT_NE(std::string::npos, at);
+    const T_POLC_D along = ParseGood(text).model.pushovers.at(1);
+    text.replace(at, text.find(',', at) - at, "\"direction\": \"RY\"");
+    const T_MODEL_CONTENT content = ParseGood(text);
+    const T_POLC_D& about = content.model.pushovers.at(1);
+    EXPECT_DOUBLE_EQ(along.control->masterMaxDispl / 0.0254, about.control->masterMaxDispl);
+    EXPECT_EQ((std::vector{-2.0, -3.5}), about.additionalDisplacements);
+    EXPECT_EQ(text, PrintGood(content));
+    ExpectLosslessInEveryUnit(content);
+}
+
 TEST(PushCase, BadInputNamesThePlace)
 {
     ExpectRefused(AllText(), "push_refusals.txt");
