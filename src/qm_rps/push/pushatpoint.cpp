@@ -2,10 +2,11 @@
 
 #include <algorithm>
 #include <cmath>
+#include <tuple>
 
 namespace {
 
-constexpr double kSame = 1e-9; // of the largest displacement of the run
+constexpr double kSame = 1e-9; // of the largest displacement of the run, of a ratio
 
 constexpr std::size_t kCp = 2; // of the marks IO, LS, CP
 
@@ -29,6 +30,23 @@ std::optional<double> LimitOf(const T_PUSH_HINGE_SERIES& hinge, double deformati
 bool HasLost(PUSH_STATE state)
 {
     return state >= PUSH_STATE::CtoD;
+}
+
+/// By place: what stands first where nothing else tells two components apart.
+bool StandsBefore(const T_HINGE_AT_POINT& a, const T_HINGE_AT_POINT& b)
+{
+    const auto place = [](const T_HINGE_AT_POINT& h) {
+        return std::tuple(h.place.element, h.place.hinge, h.place.component);
+    };
+    return place(a) < place(b);
+}
+
+/// Ratios that differ by rounding alone are one: the units of the file must not order them.
+bool IsAsBad(const T_HINGE_AT_POINT& a, const T_HINGE_AT_POINT& b)
+{
+    if (HasLost(a.state) != HasLost(b.state) || a.ratio.has_value() != b.ratio.has_value())
+        return false;
+    return a.ratio ? std::fabs(*a.ratio - *b.ratio) <= kSame * *a.ratio : a.state == b.state;
 }
 
 /// Those that have lost strength, then larger ratios, then those without one by their state.
@@ -55,6 +73,12 @@ void TakeStep(const T_PUSH_RUN& run, std::size_t step, T_PUSH_AT_POINT& to)
         to.worst.push_back(std::move(at));
     }
     std::ranges::stable_sort(to.worst, IsWorse);
+    for (auto from = to.worst.begin(); from != to.worst.end();) {
+        const auto other = std::find_if_not(
+            from, to.worst.end(), [&](const T_HINGE_AT_POINT& h) { return IsAsBad(*from, h); });
+        std::stable_sort(from, other, StandsBefore);
+        from = other;
+    }
     if (to.worst.size() > kMostWorst) to.worst.resize(kMostWorst);
     for (const T_PUSH_STOREY_SERIES& storey : run.storeys) {
         T_STOREY_AT_POINT at{storey.name, storey.displacement[step], storey.drift[step], {}};

@@ -39,7 +39,8 @@ struct T_PUSH_AT_POINT {
     int step = 0;                      // of the run, from 1
     double loadFactor = 0.0;
     std::array<std::size_t, kPushStateNames.size()> states{}; // components by state
-    /// At most kMostWorst, none is elastic: those beyond C, then by falling ratio.
+    /// At most kMostWorst, none is elastic: those beyond C, then by falling ratio, equal ones by
+    /// element, place on it and component.
     std::vector<T_HINGE_AT_POINT> worst;
     std::vector<T_STOREY_AT_POINT> storeys;
 };

@@ -23,6 +23,23 @@ T_PUSH_HINGE_SERIES Hinge(int element, double deformation, PUSH_STATE state, boo
 
 } // namespace
 
+// Ratios 0.5 but for the last digits: element and component order them, not the units of the file.
+TEST(PushAtPoints, EqualRatiosStandByPlace)
+{
+    T_PUSH_RUN run;
+    run.loadFactor = run.displacement = {0.1};
+    run.hinges = {Hinge(3, 0.01 * (1 + 1e-14), PUSH_STATE::IOtoLS),
+                  Hinge(2, 0.01, PUSH_STATE::IOtoLS), Hinge(1, 0.0099, PUSH_STATE::IOtoLS),
+                  Hinge(2, 0.01 * (1 + 2e-14), PUSH_STATE::IOtoLS)};
+    run.hinges[3].place.component = HINGE_COMPONENT::Fx;
+    const auto points = PushAtPoints(run, {{PUSH_POINT::Performance, "", 0.1}});
+    std::string order;
+    for (const T_HINGE_AT_POINT& h : points.at(0).worst)
+        order += std::to_string(h.place.element) +
+                 (h.place.component == HINGE_COMPONENT::Fx ? "x " : "y ");
+    EXPECT_EQ("2x 2y 3y 1y ", order);
+}
+
 TEST(PushAtPoints, ListsLostStrengthBeforeRatiosAndThoseBeforeUnknownOnes)
 {
     T_PUSH_RUN run;
