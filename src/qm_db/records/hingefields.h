@@ -138,6 +138,26 @@ void CaseFields(V& v, T_FIELD_REF<V, T_SKEL_MULTI_SIDE> r, const T_CURVE_DIMS& d
     v.Opt("user_stiffness", r.userStiffness, 0.0, dims.Stiffness());
 }
 
+/// A symmetric curve without a negative side has the gap of the positive one on both. The side that
+/// was left out is told from one that is written without a gap.
+template <class V>
+void MultiSides(V& v, T_FIELD_REF<V, T_SKEL_MULTI> r, const T_CURVE_DIMS& dims)
+{
+    v.Part("positive", r.sides.pos, dims);
+    T_SKEL_MULTI_SIDE leftOut;
+    if (r.symmetric) leftOut.gap = r.sides.pos.gap;
+    if constexpr (V::kReads) {
+        if (!v.Has("negative")) {
+            r.sides.neg = leftOut;
+            return;
+        }
+    } else if constexpr (V::kWrites) {
+        if (!(r.sides.neg == leftOut)) v.NeedPart("negative", r.sides.neg, dims);
+        return;
+    }
+    v.Part("negative", r.sides.neg, dims);
+}
+
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_SKEL_MULTI> r, const T_CURVE_DIMS& dims)
 {
@@ -149,7 +169,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_SKEL_MULTI> r, const T_CURVE_DIMS& dims)
     v.EnumOpt("initial_stiffness", r.initStiffness, d.initStiffness, kStiffnessNames,
               "IDS_QM_CHOICE_STIFFNESS");
     v.EnumOpt("gap_sides", r.gapSides, d.gapSides, kGapNames, "IDS_QM_CHOICE_GAP_SIDE");
-    CaseFields(v, r.sides, dims);
+    MultiSides<V>(v, r, dims);
 }
 
 /// The alternative has been set by the type of the component.

@@ -64,6 +64,28 @@ TEST(HingeCase, ReadsMembersIntoTheirFieldsInSi)
     EXPECT_EQ((T_POLC_CONTROL{0, 2, 1, 0.1, true, 2.5, false, -4 * in, 8 * in}), *run.control);
 }
 
+// What stands beside "positive": {"gap": 4} of a slip curve, and the gap of the negative side, in.
+TEST(HingeCase, ASymmetricCurveWithoutANegativeSideHasTheGapOnBoth)
+{
+    const struct {
+        const char *before, *after;
+        double gap;
+    } kCases[] = {{"", "", 4},
+                  {"", ", \"negative\": {}", 0},
+                  {"", ", \"negative\": {\"gap\": 3}", 3},
+                  {"\"symmetric\": false, ", "", 0}};
+    for (const auto& c : kCases) {
+        const T_MODEL_CONTENT content = ParseGood(
+            std::string(R"({"format": "qm-rps case 1", "units": {"force": "kips", "length": "in"},
+            "hinge_types": [{"name": "T", "element": "beam-column", "components": {"Fx": {
+            "type": "slip bilinear", "curve": {)") +
+            c.before + R"("positive": {"gap": 4})" + c.after + "}}}}]}");
+        const auto& curve = content.model.hingeTypes.at(1).components[0].curves.I;
+        EXPECT_DOUBLE_EQ(c.gap * 0.0254, std::get<T_SKEL_MULTI>(curve).sides.neg.gap) << c.after;
+        ExpectRoundTrips(content, c.after);
+    }
+}
+
 TEST(HingeCase, EveryChoiceOfEveryListComesBack)
 {
     T_MODEL_CONTENT content = ParseGood(RichText());
