@@ -20,13 +20,16 @@ constexpr double kAside = 1e-9;    // of the range: how far the ends of an uprig
 constexpr double kRounding = 1e-9; // of the largest moment: at its tips a line has none
 constexpr double kBeyond = 1e15;   // N: no member comes there
 
-/// The points of a curve P / Pmax, M / largest, whichever way they run.
+/// The points of a curve P / Pmax, M / largest, whichever way they run. A side whose moments are
+/// entered with their sign, none above 0, has their magnitudes.
 template <class POINTS>
 T_LINE LineOf(const POINTS& points, double pMax)
 {
+    const bool isSigned = std::ranges::all_of(
+        points, [](double m) { return m <= kRounding; }, &T_PM_POINT::m);
     T_LINE line;
     for (const T_PM_POINT& p : points)
-        line.push_back({-p.p * pMax, std::fabs(p.m) <= kRounding ? 0.0 : p.m});
+        line.push_back({-p.p * pMax, std::fabs(p.m) <= kRounding ? 0.0 : (isSigned ? -p.m : p.m)});
     if (line.front().axial > line.back().axial) std::ranges::reverse(line);
     const double aside = kAside * (line.back().axial - line.front().axial);
     T_LINE out;
@@ -159,6 +162,16 @@ void FromList(const T_SKEL_FEMA& curve, std::vector<solver::T_AXIAL_STRENGTH>& o
     out.push_back(last);
 }
 
+/// What the engine takes.
+bool AreStrengths(const std::vector<solver::T_AXIAL_STRENGTH>& rows)
+{
+    const auto falls = [](const auto& a, const auto& b) { return !(a.axial < b.axial); };
+    return rows.size() > 1 && std::ranges::adjacent_find(rows, falls) == rows.end() &&
+           std::ranges::all_of(rows, [](const solver::T_AXIAL_STRENGTH& row) {
+               return row.positive >= 0.0 && row.negative >= 0.0;
+           });
+}
+
 } // namespace
 
 int StrengthsByAxial(const T_AXIAL_BASIS& basis, std::vector<solver::T_AXIAL_STRENGTH>& out,
@@ -177,6 +190,10 @@ int StrengthsByAxial(const T_AXIAL_BASIS& basis, std::vector<solver::T_AXIAL_STR
         done = FromSurface(basis, rows, reason);
     } else if (interaction == HINGE_INTERACTION::User) {
         done = FromUser(basis, rows, reason);
+    }
+    if (done && !rows.empty() && !AreStrengths(rows)) {
+        reason = Say("IDS_QM_ENGINE_HINGE_AXIAL_ROWS");
+        return 0;
     }
     if (done) out = std::move(rows);
     return done;

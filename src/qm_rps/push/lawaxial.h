@@ -31,6 +31,8 @@ struct T_AXIAL_BASIS {
 /// curves give the shape alone: the yield strength of the hinge is that at no axial force (MY0), so
 /// it may be below the largest one. Curves by axial force with automatic strengths
 /// follow section and material.
-/// 1 done; 0 with the reason: there is no curve, or it does not reach a force of 0.
+/// A side of a curve may be entered with negative moments throughout.
+/// 1 done; 0 with the reason: there is no curve, it does not reach a force of 0, or its moments
+/// have both signs.
 [[nodiscard]] int StrengthsByAxial(const T_AXIAL_BASIS& basis,
                                    std::vector<solver::T_AXIAL_STRENGTH>& out, std::string& reason);

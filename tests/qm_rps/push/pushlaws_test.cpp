@@ -150,6 +150,14 @@ TEST(PushLaws, InteractionGivesStrengthsByAxialForce)
     std::copy_n(pos.begin(), 10, level.y.curves.pos.begin());
     std::copy_n(neg.begin(), 10, level.y.curves.neg.begin());
     check(surface, true);
+    for (T_PM_POINT& p : level.y.curves.neg)
+        p.m = -p.m; // with the sign of its side
+    check(surface, true);
+    level.y.curves.neg[4].m = 0.5; // of both signs
+    std::string why;
+    EXPECT_TRUE(Build(surface, {Hinge()}, why).hinges.empty());
+    EXPECT_NE(std::string::npos, why.find("element 1, type \"T\", My I: strengths by axial"))
+        << why;
     type.pmm.reset();
     std::string error;
     EXPECT_TRUE(Build(type, {Hinge()}, error).hinges.empty());
