@@ -7,6 +7,7 @@
 #include "qm_rps/hinge/hingetypefindings.h"
 #include "qm_rps/po_hingetypedlg.h"
 #include "qm_rps/po_hingetypelistdlg.h"
+#include "qm_rps/push/pushwarnings.h"
 #include "qm_rps/push/stopwarnings.h"
 #include "qm_rps/pushoverhingelistdlg.h"
 
@@ -196,6 +197,10 @@ EXIT_CODE RunCaseCheck(const std::string& file)
             PrintLine(Say("IDS_QM_CLI_CASE_WARNING", polc.name, f.field, f.text));
             ++warnings;
         }
+    }
+    for (const std::string& warning : PushWarnings(doc)) {
+        PrintLine(warning);
+        ++warnings;
     }
     PrintLine(Say("IDS_QM_CLI_HINGE_CASE_FINDINGS", std::to_string(model.pushovers.size()),
                   std::to_string(findings)));

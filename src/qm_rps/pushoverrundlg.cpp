@@ -5,6 +5,7 @@
 #include "qm_rps/evaluatedsteps.h"
 #include "qm_rps/push/pushquantity.h"
 #include "qm_rps/push/pushresultlist.h"
+#include "qm_rps/push/pushwarnings.h"
 #include "qm_rps/push/pushworker.h"
 
 #include <algorithm>
@@ -250,5 +251,9 @@ std::string CPushOverRunDlg::StatusText() const
     for (const T_ROW& row : m_rows)
         text += (text.empty() ? "" : "\n") + row.name + ": " + row.advice;
     if (!text.empty()) return text;
-    return Say(m_cases.empty() ? "IDS_QM_CLI_PUSH_NO_CASE" : "IDS_QM_UI_PUSH_RUN_READY");
+    if (m_cases.empty()) return Say("IDS_QM_CLI_PUSH_NO_CASE");
+    text = Say("IDS_QM_UI_PUSH_RUN_READY");
+    for (const std::string& warning : PushWarnings(m_doc))
+        text += "\n" + warning;
+    return text;
 }

@@ -6,6 +6,7 @@
 #include "qm_base/textformat.h"
 #include "qm_db/recordfacts.h"
 #include "qm_rps/push/pushquantity.h"
+#include "qm_rps/push/pushwarnings.h"
 
 #include <cstdio>
 #include <unistd.h>
@@ -59,6 +60,8 @@ EXIT_CODE PushCases(CDBDoc& doc, const std::string& file, const std::vector<int>
                     std::vector<T_PUSH_RUN>& out)
 {
     const CInterrupt interrupt;
+    for (const std::string& warning : keys.empty() ? std::vector<std::string>() : PushWarnings(doc))
+        std::fprintf(stderr, "%s\n", warning.c_str());
     CPushRun push(doc);
     for (const int key : keys) {
         if (const EXIT_CODE code = PushOne(doc, file, push, key, out); code != EXIT_CODE::Done)

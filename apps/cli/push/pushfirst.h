@@ -6,7 +6,8 @@
 
 #include <set>
 
-/// Pushes these load cases (keys) one after the other, with progress on a terminal; Ctrl-C ends the
+/// Pushes these load cases (keys) one after the other, with what should be known of the hinges
+/// (PushWarnings) on stderr and progress on a terminal; Ctrl-C ends the
 /// one that runs, with its steps, and starts no other. Their results become those of the document.
 /// Where a load case asks for steps at the performance points of its evaluations, it is pushed
 /// again with these. Done, or the code to exit with after one line on stderr.

@@ -3,8 +3,10 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/hinge/backbonerules.h"
+#include "qm_rps/hinge/pageyield.h"
 
 #include <algorithm>
+#include <cmath>
 
 namespace {
 
@@ -100,6 +102,41 @@ void CheckUnder(const char* key, BACKBONE_CHECK check, const T_BACKBONE& b,
     }
 }
 
+/// A strength and the deformation that is entered for it.
+template <class SIDE>
+struct T_YIELD_ENTRY {
+    double SIDE::*strength;
+    double SIDE::*deform;
+    const char *name, *field;
+};
+constexpr T_YIELD_ENTRY<T_SKEL_SIDE> kYieldDeform{&T_SKEL_SIDE::yield, &T_SKEL_SIDE::yieldDeform,
+                                                  "yield_deform", "sides.pos.yieldDeform"};
+constexpr T_YIELD_ENTRY<T_SKEL_MULTI_SIDE> kFirstDeform{
+    &T_SKEL_MULTI_SIDE::P1, &T_SKEL_MULTI_SIDE::D1, "D1", "sides.pos.D1"};
+
+/// `two`: the negative side has a user stiffness of its own.
+template <class SIDE>
+void WarnOfStiffness(const T_YIELD_ENTRY<SIDE>& entry, const T_SIDES<SIDE>& sides, bool symmetric,
+                     bool two, const T_HINGE_PLACE& place, T_FINDINGS& out)
+{
+    constexpr double kApart = 0.01; // entered numbers have few digits
+    const auto warn = [&](const SIDE& s, double stiffness, HINGE_SIDE side) {
+        const double strength = std::fabs(s.*entry.strength), deform = std::fabs(s.*entry.deform);
+        if (!(strength > 0.0 && deform > 0.0 && stiffness > 0.0)) return;
+        const double acting = strength / stiffness;
+        if (std::fabs(deform - acting) <= kApart * acting) return;
+        const std::string text = FormatText("%.6g / %.6g = %.6g; %s = %.6g", strength, stiffness,
+                                            acting, entry.name, deform);
+        out.push_back(FindingOf(T_HINGE_HEAD{.message = "IDS_QM_HINGE_STIFFNESS_ACTS",
+                                             .text = text.c_str(),
+                                             .field = entry.field},
+                                place.On(side)));
+    };
+    warn(sides.pos, sides.pos.userStiffness, HINGE_SIDE::Positive);
+    if (!symmetric)
+        warn(sides.neg, (two ? sides.neg : sides.pos).userStiffness, HINGE_SIDE::Negative);
+}
+
 } // namespace
 
 void CurveFindings(const T_SKEL_FEMA& curve, const T_HINGE_PLACE& place, T_FINDINGS& out)
@@ -166,6 +203,27 @@ std::vector<T_FINDING> DiagramFindings(const T_SKEL_FEMA& curve, HINGE_COMPONENT
         CheckUnder("IDS_PUSHOVER_Wrong_Data_in_the_Hinge_Diagram_Table_", *check, b, place, out);
     CheckUnder("IDS_PUSHOVER_Wrong_Data_in_Acceptance_Criteria_", CheckAcceptance, b, place, out);
     return out;
+}
+
+void StiffnessWarnings(const T_SKEL_CURVE& curve, SKEL_TYPE type, const T_HINGE_PLACE& place,
+                       T_FINDINGS& out)
+{
+    const bool two = HasTwoStiffnesses(curve);
+    const auto* m = std::get_if<T_SKEL_MULTI>(&curve);
+    if (m) {
+        const bool isEntered = !m->autoYield || IsTrilinear(type); // P1
+        if (!m->useDeformation || m->initStiffness != INIT_STIFFNESS::User || !isEntered) return;
+        WarnOfStiffness(kFirstDeform, m->sides, m->symmetric, two, place, out);
+    } else if (const auto* e = std::get_if<T_SKEL_EC8>(&curve)) {
+        if (e->autoYield || e->initStiffness != INIT_STIFFNESS::User) return;
+        WarnOfStiffness(kYieldDeform, e->sides, e->symmetric, two, place, out);
+    } else {
+        const F& f = std::get<F>(curve);
+        if (f.autoYield || f.initStiffness != INIT_STIFFNESS::User) return;
+        ForEachForce(f, place, [&](const T_SIDES<T_SKEL_SIDE>& sides, const T_HINGE_PLACE& at) {
+            WarnOfStiffness(kYieldDeform, sides, f.symmetric, two, at, out);
+        });
+    }
 }
 
 void PointWarnings(const T_SKEL_CURVE& curve, const T_HINGE_PLACE& place, T_FINDINGS& out)

@@ -25,6 +25,11 @@ std::vector<T_FINDING> DiagramFindings(const T_SKEL_FEMA& curve, HINGE_COMPONENT
 void RatioWarnings(const T_SKEL_MULTI& curve, SKEL_TYPE type, const T_HINGE_PLACE& place,
                    std::vector<T_FINDING>& out);
 
+/// A yield deformation, or a first deformation D1, beside a user stiffness that gives another one
+/// with the entered strength: the push takes the stiffness. No refusal.
+void StiffnessWarnings(const T_SKEL_CURVE& curve, SKEL_TYPE type, const T_HINGE_PLACE& place,
+                       std::vector<T_FINDING>& out);
+
 /// Points of a FEMA or Eurocode curve that are not where its measure has them: B at the yield
 /// point, CP not beyond E. No refusal. A panel strut in its general form has axes of its own.
 void PointWarnings(const T_SKEL_CURVE& curve, const T_HINGE_PLACE& place,

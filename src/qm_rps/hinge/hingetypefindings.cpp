@@ -233,6 +233,19 @@ std::vector<T_FINDING> HingeTypeFindings(const T_PHGT_D& type, const T_HINGE_CON
     return out;
 }
 
+std::vector<T_FINDING> VoidInputWarnings(const T_PHGT_D& type)
+{
+    std::vector<T_FINDING> out;
+    for (std::size_t i = 0; i < type.components.size(); ++i) {
+        const T_HINGE_COMPONENT& c = type.components[i];
+        if (!c.active) continue;
+        ForEachPage(c, [&](HINGE_END end, const T_SKEL_CURVE& curve) {
+            StiffnessWarnings(curve, c.type, {static_cast<int>(i), end}, out);
+        });
+    }
+    return out;
+}
+
 std::vector<T_FINDING> HingeTypeWarnings(const T_PHGT_D& type)
 {
     std::vector<T_FINDING> out;
@@ -246,5 +259,7 @@ std::vector<T_FINDING> HingeTypeWarnings(const T_PHGT_D& type)
             if (const auto* f = std::get_if<T_SKEL_FEMA>(&curve)) ForceWarning(*f, place, out);
         });
     }
+    const std::vector<T_FINDING> voids = VoidInputWarnings(type);
+    out.insert(out.end(), voids.begin(), voids.end());
     return out;
 }

@@ -11,9 +11,11 @@ std::vector<T_FINDING> HingeTypeFindings(const T_PHGT_D& type, const T_HINGE_CON
 
 /// Of several multilinear curves with stiffness reduction ratios, those that the ratios do not
 /// suit: a ratio above 1 (harder than the initial stiffness), or alpha2 above alpha1. Then, page by
-/// page, points that are not where the curve's measure has them (PointWarnings), and entered curves
-/// by axial force that do not reach a force of 0. No refusal.
+/// page, points that are not where the curve's measure has them (PointWarnings), entered curves by
+/// axial force that do not reach a force of 0, and VoidInputWarnings. No refusal.
 std::vector<T_FINDING> HingeTypeWarnings(const T_PHGT_D& type);
+/// Values of the active components that another entered value makes void (StiffnessWarnings).
+std::vector<T_FINDING> VoidInputWarnings(const T_PHGT_D& type);
 
 /// Automatic strengths of active components that can't be calculated from this section and
 /// material: a fault of the section, or no method for the component; and crack strengths above the

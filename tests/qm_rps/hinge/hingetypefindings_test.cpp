@@ -259,6 +259,38 @@ TEST(HingeTypeWarnings, RatiosMustSuitSeveralCurvesAtOnce)
     }
 }
 
+TEST(HingeTypeWarnings, AUserStiffnessMakesAnotherYieldDeformationVoid)
+{
+    const struct {
+        bool multi;
+        double K, deform; // beside a strength of 200
+        const char* text; // empty: no warning
+    } kCases[] = {{false, 50000, 0.006, "200 / 50000 = 0.004; yield_deform = 0.006"},
+                  {false, 50000, 0.00402, ""}, // as many digits as somebody enters
+                  {false, 0, 0.006, ""},       // rigid: the plastic measure has no other yield
+                  {true, 40000, 0.01, "200 / 40000 = 0.005; D1 = 0.01"},
+                  {true, 40000, 0.005, ""}};
+    for (const auto& c : kCases) {
+        T_PHGT_D t;
+        if (c.multi) {
+            T_SKEL_MULTI m;
+            m.autoYield = false, m.useDeformation = true, m.initStiffness = INIT_STIFFNESS::User;
+            m.sides.pos = {.P1 = 200, .D1 = c.deform, .D2 = 0.05, .userStiffness = c.K};
+            t.components[4] = ComponentWith(SKEL_TYPE::Bilinear, m);
+        } else {
+            t = Type();
+            T_SKEL_FEMA& f = Fema(t);
+            f.autoYield = false, f.initStiffness = INIT_STIFFNESS::User;
+            f.symmetric = true;
+            f.sides.pos.yield = 200, f.sides.pos.yieldDeform = c.deform;
+            f.sides.pos.userStiffness = c.K;
+        }
+        const auto found = HingeTypeWarnings(t);
+        EXPECT_EQ(*c.text ? 1u : 0u, found.size()) << c.text;
+        EXPECT_EQ(c.text, First(found));
+    }
+}
+
 TEST(HingeTypeWarnings, PointsLieWhereTheMeasureHasThem)
 {
     using F = T_SKEL_FEMA;
