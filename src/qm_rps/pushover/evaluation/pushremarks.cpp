@@ -4,6 +4,7 @@
 #include "qm_base/textformat.h"
 #include "qm_db/recordfacts.h"
 #include "qm_rps/pushover/adrsformulas.h"
+#include "qm_rps/pushover/evaluation/missedvertex.h"
 
 #include <algorithm>
 #include <cmath>
@@ -20,6 +21,7 @@ constexpr double kLargestShear = 3.0;        // of the weight
 constexpr double kParticipationApart = 0.01; // of what masses and shape give
 constexpr double kCodeDamping = 5.0;         // per cent, of the spectra that are reduced
 constexpr double kSameDamping = 1e-9;
+constexpr double kMissedVertex = 0.01; // of the curve's largest force or displacement
 
 class CRemarks {
 public:
@@ -33,6 +35,7 @@ public:
     void OnPeriods();
     void OnFigures();
     void OnParticipation();
+    void OnSteps();
 
 private:
     void Say(const char* key, std::initializer_list<std::string_view> values)
@@ -210,6 +213,25 @@ void CRemarks::OnParticipation()
                                           Number(gamma), Number(alpha)});
 }
 
+// The curve of a push of our own is exact at its vertices; an evaluation reads its steps. How far
+// the line through these misses a vertex is counted in the plane of the whole curve, 1 by 1.
+void CRemarks::OnSteps()
+{
+    int key = 0;
+    T_MISSED_VERTEX worst;
+    if (!m_doc.Attr().FindPolc(m_result.eval.push, key)) return;
+    IPushRun* const run = m_doc.Post().RunOf(key);
+    const int node = m_doc.Data().Model().pushovers.at(key).controlNode;
+    if (!run || !FindMissedVertex(*run, node, worst) || !(worst.share > kMissedVertex)) return;
+    const T_UNITS& units = m_result.units;
+    const int direction = m_result.loadCase.direction;
+    const double d = FromSi(worst.displacement, units, DisplacementDim(direction));
+    const double V = FromSi(worst.baseReaction, units, ReactionDim(direction));
+    Say("IDS_QM_WARN_COARSE_STEPS",
+        {std::to_string(worst.steps), FormatText("%.2g", 100.0 * worst.share), Number(d),
+         Number(V)});
+}
+
 } // namespace
 
 void AddRemarks(CDBDoc& doc, const T_SPFC_D& spectrum, T_PUSH_EVALUATION& result)
@@ -221,4 +243,5 @@ void AddRemarks(CDBDoc& doc, const T_SPFC_D& spectrum, T_PUSH_EVALUATION& result
     remarks.OnPeriods();
     remarks.OnFigures();
     remarks.OnParticipation();
+    remarks.OnSteps();
 }
