@@ -52,6 +52,7 @@ T_PHGT_D ValidType()
     T_PHGT_D t;
     t.name = "column";
     T_SKEL_FEMA f = ValidBackbone<T_SKEL_FEMA>();
+    f.sides.pos.yieldDeform = f.sides.neg.yieldDeform = 0; // the stiffness gives another one
     t.components[0] = ComponentWith(SKEL_TYPE::Fema, f);
     t.components[4] = ComponentWith(SKEL_TYPE::Fema, f);
     t.components[4].sameEnds = false;

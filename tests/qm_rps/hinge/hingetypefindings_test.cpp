@@ -313,6 +313,7 @@ TEST(HingeTypeWarnings, PointsLieWhereTheMeasureHasThem)
     // clang-format on
     for (const auto& [rule, spoil] : kCases) {
         T_PHGT_D t = Type();
+        Fema(t).initStiffness = INIT_STIFFNESS::EI6L; // gives no yield deformation of its own
         spoil(Fema(t));
         const auto found = HingeTypeWarnings(t);
         EXPECT_EQ(*rule ? 1u : 0u, found.size()) << rule;
