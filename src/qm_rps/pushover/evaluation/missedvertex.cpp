@@ -1,5 +1,7 @@
 #include "qm_rps/pushover/evaluation/missedvertex.h"
 
+#include "qm_rps/pushover/adrsformulas.h"
+
 #include <algorithm>
 #include <cmath>
 #include <limits>
@@ -42,9 +44,14 @@ int FindMissedVertex(IPushRun& run, int controlNode, T_MISSED_VERTEX& out)
     std::vector<T_PLACE> line{{}}, vertices; // line: from where the push starts
     for (const T_RUN_STEP& s : steps)
         line.push_back({s.displacement - start, s.baseReaction - reaction});
-    for (const T_RUN_EVENT& e : events)
-        if (e.stage == steps.back().stage)
-            vertices.push_back({e.displacement - start, e.baseReaction - reaction});
+    double furthest = 0.0; // what steps back from there is the inside of a drop, not of the curve
+    for (const T_RUN_EVENT& e : events) {
+        const T_PLACE vertex{e.displacement - start, e.baseReaction - reaction};
+        if (e.stage != steps.back().stage || std::fabs(vertex.d) < furthest * (1.0 - kSameOnCurve))
+            continue;
+        furthest = std::fabs(vertex.d);
+        vertices.push_back(vertex);
+    }
     const double d = Largest(line, &T_PLACE::d), V = Largest(line, &T_PLACE::V);
     if (!(d > 0.0) || !(V > 0.0)) return 0;
     const auto scaled = [=](const T_PLACE& p) { return T_PLACE{p.d / d, p.V / V}; };

@@ -3,7 +3,8 @@
 
 #include "qm_db/dbdoc.h"
 
-/// The vertex of a run that the line through its steps misses by most, of the push alone; SI.
+/// The vertex of a run that the line through its steps misses by most, of the push alone; SI. Those
+/// that a drop of strength passes on its way back do not count.
 struct T_MISSED_VERTEX {
     double share = 0.0; // distance, with displacements over the largest one and forces likewise
     double displacement = 0.0, baseReaction = 0.0;

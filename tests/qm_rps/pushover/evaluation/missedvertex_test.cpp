@@ -22,10 +22,11 @@ T_RUN_DATA Bar(const std::vector<double>& stored)
         run.displacement.push_back({{0.003 + d}});
         run.states.emplace_back();
     }
-    T_RUN_EVENT initial, yield;
+    T_RUN_EVENT initial, yield, back; // the last one while strength drops
     initial.stage = -1, initial.baseReaction = 80.0;
     yield.displacement = 0.013, yield.baseReaction = 105.0;
-    run.events = {initial, yield};
+    back.displacement = 0.010, back.baseReaction = 20.0;
+    run.events = {initial, yield, back};
     return run;
 }
 
