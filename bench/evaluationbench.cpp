@@ -175,7 +175,7 @@ void AreaPeakSearch(benchmark::State& state)
     for (auto _ : state) {
         const T_ADRS_VIEW curve = input.capacity.View();
         benchmark::DoNotOptimize(AreaTo(curve, FirstPlaceAt(curve, 0.4)));
-        benchmark::DoNotOptimize(FindPeakStep(input.capacity.Sa));
+        benchmark::DoNotOptimize(FirstMaximum(input.capacity.Sa));
         benchmark::DoNotOptimize(FindNearestSteps(input.capacity.Sd, demands));
     }
 }

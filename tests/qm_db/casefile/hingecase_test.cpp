@@ -77,8 +77,8 @@ TEST(HingeCase, ASymmetricCurveWithoutANegativeSideHasTheGapOnBoth)
     for (const auto& c : kCases) {
         const T_MODEL_CONTENT content = ParseGood(
             std::string(R"({"format": "qm-rps case 1", "units": {"force": "kips", "length": "in"},
-            "nodes": [], "hinge_types": [{"name": "T", "element": "beam-column", "components": {"Fx": {
-            "type": "slip bilinear", "curve": {)") +
+            "nodes": [], "hinge_types": [{"name": "T", "element": "beam-column",
+            "components": {"Fx": {"type": "slip bilinear", "curve": {)") +
             c.before + R"("positive": {"gap": 4})" + c.after + "}}}}]}");
         const auto& curve = content.model.hingeTypes.at(1).components[0].curves.I;
         EXPECT_DOUBLE_EQ(c.gap * 0.0254, std::get<T_SKEL_MULTI>(curve).sides.neg.gap) << c.after;
