@@ -233,20 +233,6 @@ void MigrateFrom3(const CSqliteDb& db)
         db.Exec(sql);
 }
 
-/// Version 4 had no results of a push of our own.
-void MigrateFrom4(const CSqliteDb& db)
-{
-    for (const char* const sql : kVersion5)
-        db.Exec(sql);
-}
-
-/// Version 5 did not know which end of an element, or which storey, had ended a push.
-void MigrateFrom5(const CSqliteDb& db)
-{
-    db.Exec("ALTER TABLE push_results ADD COLUMN end_hinge INTEGER NOT NULL DEFAULT 0;"
-            "ALTER TABLE push_results ADD COLUMN end_storey INTEGER NOT NULL DEFAULT 0");
-}
-
 /// Tables of a version, in the order in which it makes them.
 std::vector<std::string> TablesOf(int version)
 {
@@ -264,6 +250,21 @@ std::vector<std::string> TablesOf(int version)
         }
     }
     return all;
+}
+
+/// Version 4 had no results of a push of our own.
+void MigrateFrom4(const CSqliteDb& db)
+{
+    const std::vector<std::string> all = TablesOf(5);
+    for (std::size_t i = TablesOf(4).size(); i < all.size(); ++i)
+        db.Exec(all[i]);
+}
+
+/// Version 5 did not know which end of an element, or which storey, had ended a push.
+void MigrateFrom5(const CSqliteDb& db)
+{
+    db.Exec("ALTER TABLE push_results ADD COLUMN end_hinge INTEGER NOT NULL DEFAULT 0;"
+            "ALTER TABLE push_results ADD COLUMN end_storey INTEGER NOT NULL DEFAULT 0");
 }
 
 } // namespace
