@@ -186,7 +186,7 @@ TEST(HingeCase, FilesOfOlderVersionsOpenAndAreSavedAsTheCurrentVersion)
         m.stages[1] = {"S1", {{1}, {1}, {{1, -1}}}, {}, 2, 3.0};
         m.pushControl.steps = 7;
         ASSERT_EQ(1, store.Save(path, content, error)) << error.text;
-        EXPECT_EQ(5, BytesOf(path)[63]);
+        EXPECT_EQ(6, BytesOf(path)[63]);
         ASSERT_EQ(1, CModelStore::CheckWhole(path, error)) << error.text;
         ASSERT_EQ(1, CModelStore().Open(path, OPEN_MODE::ReadOnly, again, error)) << error.text;
         EXPECT_TRUE(SameContent(content, again));
