@@ -23,7 +23,7 @@ struct T_HINGE_STATE {
 struct T_PUSH_STEP {
     std::size_t stage = 0;
     double loadFactor = 0.0;
-    double displacement = 0.0; // of the control, total
+    double displacement = 0.0; // of the control node along the control, total
     T_VEC6 base{};             // sum of the reactions, forces and moments about the origin, global
     double residual = 0.0;     // forces out of balance over the largest force, whole structure
     bool additional = false;   // asked for by the user

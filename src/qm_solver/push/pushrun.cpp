@@ -100,7 +100,8 @@ CPushRun::T_FAULT CPushRun::InitialPath(T_PUSH_END& end, bool& goesOn)
     m_nodeWatch.clear();
     m_driftWatch.clear();
     const T_PUSH_STAGE stage = InitialStage(m_model);
-    m_nodeWatch.push_back(m_path->Watch(m_structure.Displacement(m_follows.node, m_follows.way)));
+    m_controlWatch = m_path->Watch(m_structure.Displacement(m_follows.node, m_follows.way));
+    m_nodeWatch.push_back(m_controlWatch);
     if (auto fault = m_path->BeginStage(0, std::nullopt)) return fault;
     MakeTargets(stage);
     if (auto fault = Follow(stage, -1, end)) return fault;
@@ -156,16 +157,14 @@ CPushRun::T_FAULT CPushRun::Stage(T_PUSH_STAGE stage, std::size_t number, T_PUSH
     return {};
 }
 
-void CPushRun::NoteEvent(const T_PUSH_STAGE& stage, int number)
+void CPushRun::NoteEvent(int number)
 {
     T_PUSH_EVENT event;
     event.hinges = m_path->TakeTurned();
     if (event.hinges.empty()) return;
     event.stage = number;
     event.loadFactor = m_path->Factor();
-    event.displacement = m_nodeWatch.empty() ? 0.0 : Present(stage);
-    if (stage.control == PUSH_CONTROL::LoadFactor && !m_nodeWatch.empty())
-        event.displacement = m_path->Watched(m_nodeWatch[0]);
+    event.displacement = m_path->Watched(m_controlWatch);
     event.base = Base();
     if (number < 0)
         m_events.push_back(std::move(event));
@@ -220,14 +219,14 @@ CPushRun::T_FAULT CPushRun::Store(const T_PUSH_STAGE& stage, int number, bool ad
                                   T_PUSH_END& end)
 {
     if (number < 0) return {};
-    const double displacement = stage.control == PUSH_CONTROL::LoadFactor
-                                    ? m_path->Watched(m_nodeWatch[0])
-                                    : Present(stage);
-    if (IsStored(displacement)) return {};
+    const double place = stage.control == PUSH_CONTROL::LoadFactor ? m_path->Watched(m_controlWatch)
+                                                                   : Present(stage);
+    if (IsStored(place)) return {};
+    m_storedAt = place;
     T_PUSH_STEP& step = m_steps.emplace_back();
     step.stage = static_cast<std::size_t>(number);
     step.loadFactor = m_stored = m_path->Factor();
-    m_storedAt = step.displacement = displacement;
+    step.displacement = m_path->Watched(m_controlWatch);
     step.additional = additional;
     step.hinges = m_path->HingeStates();
     m_states.push_back(m_path->State());
@@ -283,8 +282,7 @@ CPushRun::T_FAULT CPushRun::Follow(const T_PUSH_STAGE& stage, int number, T_PUSH
         }
         end.outcome = outcome;
         end.loadFactor = m_path->Factor();
-        if (!m_nodeWatch.empty())
-            end.displacement = byLoad ? m_path->Watched(m_nodeWatch[0]) : Present(stage);
+        end.displacement = m_path->Watched(m_controlWatch);
         return Flush(end);
     };
     const auto drive = [&] {
@@ -299,7 +297,7 @@ CPushRun::T_FAULT CPushRun::Follow(const T_PUSH_STAGE& stage, int number, T_PUSH
         T_FAULT fault;
         const CPushPath::WAY found = m_path->Select(fault);
         if (found == CPushPath::WAY::Fault) return fault;
-        NoteEvent(stage, number);
+        NoteEvent(number);
         if (found == CPushPath::WAY::On && m_path->WantsFold()) {
             if ((fault = Flush(end)) || (fault = m_path->Fold())) return fault;
             if (m_cancelled) return finish(end.outcome);

@@ -45,7 +45,7 @@ private:
     double Reaction(const T_PUSH_STAGE& stage) const;
     double ReactionRate(const T_PUSH_STAGE& stage) const;
     T_VEC6 Base() const;
-    void NoteEvent(const T_PUSH_STAGE& stage, int number);
+    void NoteEvent(int number);
     bool IsStored(double displacement) const;
     T_FAULT Store(const T_PUSH_STAGE& stage, int number, bool additional, T_PUSH_END& end);
     T_FAULT Update(const T_PUSH_STAGE& stage, std::optional<double> control);

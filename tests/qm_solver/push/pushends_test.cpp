@@ -56,6 +56,14 @@ std::vector<T_END_CASE> EndCases()
             PUSH_OUTCOME::StiffnessStop, 50.0, -4.0 / 3.0);
     against(other, PUSH_CONTROL::LoadFactor, 80.0);
     other.stage.stops.stiffnessRatio = 0.7;
+    // A mast of length 2 on top moves 4 / 3 + 2 (slope of the tip) + 4 (rotation of the base) = 5
+    // by the rotation 5 / 12; the control node below it by 4 / 3 + 2 of it.
+    T_END_CASE& mast = add("largest translation of another node", ideal, PUSH_OUTCOME::Reached,
+                           50.0, 4.0 / 3.0 + 10.0 / 12.0);
+    AddNode(mast.model.frame, {0, 0, 4});
+    Join(mast.model.frame, ELEMENT_KIND::Beam, 1, 2);
+    mast.stage.control = PUSH_CONTROL::LargestTranslation;
+    mast.stage.target = 5.0;
     T_END_CASE& elastic = add("no hinges, back", Column(), PUSH_OUTCOME::Reached, -3.75, -0.1);
     elastic.stage.target = -0.1;
     elastic.stage.steps = {0.5, 1.0};
