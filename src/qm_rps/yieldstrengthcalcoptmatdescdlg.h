@@ -4,7 +4,7 @@
 
 #include "qm_base/mdialog.h"
 #include "qm_db/dbdoc.h"
-#include "qm_rps/hinge/sectionbending.h"
+#include "qm_rps/codes/concretelaw.h"
 
 #include <optional>
 

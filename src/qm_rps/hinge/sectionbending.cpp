@@ -164,19 +164,6 @@ private:
 
 } // namespace
 
-T_CONCRETE_LAW ConcreteLaw(double fckMpa)
-{
-    if (fckMpa <= 50.0) return {};
-    const double below90 = std::pow((kMaxFckMpa - fckMpa) / 100.0, 4);
-    T_CONCRETE_LAW law;
-    law.n = 1.4 + 23.4 * below90;
-    law.crushStrain = (2.6 + 35.0 * below90) / 1000.0;
-    // At C90 the formulas cross in the fourth digit; the table prints 2.6 for both strains.
-    law.peakStrain =
-        std::min((2.0 + 0.085 * std::pow(fckMpa - 50.0, 0.53)) / 1000.0, law.crushStrain);
-    return law;
-}
-
 std::unique_ptr<ISectionBending> MakeSteelBending(const T_SECT_D& section, double fy, bool aboutY)
 {
     std::vector<T_SECT_PIECE> pieces = CSectionProperties::Pieces(section, aboutY);

@@ -3,22 +3,10 @@
 
 #include "qm_db/records.h"
 #include "qm_db/sectionproperties.h"
+#include "qm_rps/codes/concretelaw.h"
 
 #include <memory>
 #include <vector>
-
-/// Parabola-rectangle of concrete in compression, EN 1992-1-1 3.1.7: fck (1 - (1 - eps / peak)^n)
-/// up to the peak strain, then fck up to the crushing strain.
-struct T_CONCRETE_LAW {
-    double n = 2.0;
-    double peakStrain = 0.002;   // eps_c2
-    double crushStrain = 0.0035; // eps_cu2
-    bool operator==(const T_CONCRETE_LAW&) const = default;
-};
-/// Strongest concrete that the law is for, C90/105.
-inline constexpr double kMaxFckMpa = 90.0;
-/// EN 1992-1-1 Table 3.1, by its formulas; fck in MPa, at most kMaxFckMpa.
-T_CONCRETE_LAW ConcreteLaw(double fckMpa);
 
 /// Axial force (compression positive) and moment about the centroid.
 struct T_AXIAL_MOMENT {

@@ -1,0 +1,86 @@
+#include "qm_rps/codes/codebackbone.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace {
+
+constexpr const char* kCurve = "ASCE 41 7.4.3";
+constexpr const char* kChordCurve = "EN 1998-3 A.3.2";
+
+bool SoundInput(const T_BACKBONE_IN& in, CCodeSheet& sheet)
+{
+    sheet.Positive({{"yield", in.yield}, {"yieldDeform", in.yieldDeform}});
+    sheet.Within("slope", in.slope, 0.0, 1.0);
+    if (in.strengthCap != 0.0) sheet.Within("strengthCap", in.strengthCap, 1.0, kAnyValue);
+    return sheet.Sound();
+}
+
+/// Strength at C over the yield strength, after a plastic deformation.
+double StrengthAtC(const T_BACKBONE_IN& in, double plastic)
+{
+    const double risen = 1.0 + in.slope * plastic / in.yieldDeform;
+    return in.strengthCap > 0.0 ? std::min(risen, in.strengthCap) : risen;
+}
+
+void PutPoints(const T_CODE_BACKBONE& bone, const char* clause, CCodeSheet& sheet)
+{
+    const std::pair<const char*, const T_CODE_POINT*> points[] = {
+        {"B", &bone.B}, {"C", &bone.C}, {"D", &bone.D}, {"E", &bone.E}};
+    for (const auto& [name, point] : points) {
+        sheet.Put(std::string("D(") + name + ")", point->deform, clause, "", CODE_MARK::Computed);
+        sheet.Put(std::string("F(") + name + ")", point->strength, clause, "F / Fy",
+                  CODE_MARK::Computed);
+    }
+}
+
+} // namespace
+
+std::optional<T_CODE_BACKBONE> BackboneOfPlastic(const T_CODE_PLASTIC& p, const T_BACKBONE_IN& in,
+                                                 CCodeSheet& sheet)
+{
+    if (!SoundInput(in, sheet)) return {};
+    sheet.NotNegative({{"a", p.a}, {"b", p.b}, {"c", p.c}});
+    sheet.NotNegative({{"IO", p.IO}, {"LS", p.LS}, {"CP", p.CP}});
+    if (!sheet.Sound()) return {};
+
+    const double y = in.yieldDeform, end = std::max(p.a, p.b);
+    T_CODE_BACKBONE bone;
+    bone.yield = in.yield;
+    bone.yieldDeform = y;
+    bone.B = {y, 1.0};
+    bone.C = {y + p.a, StrengthAtC(in, p.a)};
+    bone.D = {y + p.a, p.c};
+    bone.E = {y + end, p.c};
+    if (in.acceptance)
+        bone.acceptance = {{y + p.IO, y + p.LS, y + p.CP}};
+    else
+        sheet.Warn("IDS_QM_CODE_WARN_NO_ACCEPTANCE", {kCurve});
+    bone.forceControlled = !(end > 0.0);
+    if (bone.forceControlled) sheet.Warn("IDS_QM_CODE_WARN_FORCE", {kCurve});
+    PutPoints(bone, kCurve, sheet);
+    return sheet.Sound() ? std::optional(bone) : std::nullopt;
+}
+
+std::optional<T_CODE_BACKBONE> BackboneOfChord(const T_CHORD_LIMITS& limits,
+                                               const T_BACKBONE_IN& in, CCodeSheet& sheet)
+{
+    if (!SoundInput(in, sheet) || !sheet.Within("residual", limits.residual, 0.0, 0.999)) return {};
+    if (!sheet.Within("NC", limits.NC, in.yieldDeform, kAnyValue)) return {};
+    if (!sheet.Within("SD", limits.SD, 0.0, limits.NC)) return {};
+    if (!sheet.Within("DL", limits.DL, 0.0, limits.NC)) return {};
+
+    T_CODE_BACKBONE bone;
+    bone.levels = CODE_LEVELS::DlSdNc;
+    bone.yield = in.yield;
+    bone.yieldDeform = in.yieldDeform;
+    bone.B = {in.yieldDeform, 1.0};
+    bone.C = {limits.NC, StrengthAtC(in, limits.NC - in.yieldDeform)};
+    bone.D = {limits.NC, limits.residual};
+    bone.E = {kEndOverUltimate * limits.NC, limits.residual};
+    // Where 0.75 theta_u lies below theta_y, damage is significant before yield.
+    bone.acceptance = {{std::min(limits.DL, limits.SD), limits.SD, limits.NC}};
+    sheet.Warn("IDS_QM_CODE_WARN_CONTINUED", {kChordCurve, CodeNumber(limits.residual)});
+    PutPoints(bone, kChordCurve, sheet);
+    return sheet.Sound() ? std::optional(bone) : std::nullopt;
+}
