@@ -1,0 +1,35 @@
+// Fully restrained beam-column connections of steel by ASCE 41: plastic rotations of the
+// connection, and what shortens them. The codes' acceptance values are not known to us.
+#pragma once
+
+#include "qm_rps/codes/codetable.h"
+
+enum class FR_CONNECTION {
+    WeldedFlange,         // unreinforced, as built before 1994
+    WeldedFlangeCollapse, // the same in the guides on progressive collapse: not to be mixed
+    ImprovedBoltedWeb,
+    ImprovedWeldedWeb,
+    FreeFlange,
+    ReducedBeamSection,
+    SidePlate,
+    TeeBoltShear, // double split tee, by what fails
+    TeeBoltTension,
+    TeeStemTension,
+    TeeFlexure
+};
+
+struct T_FR_CONNECTION {
+    FR_CONNECTION kind = FR_CONNECTION::WeldedFlange;
+    double depth = 0.0; // of the beam, m
+    // ASCE 41-17 9.4.2.4.3.
+    bool applyFactors = true;
+    double span = 0.0;                               // clear span L of the beam, m
+    double flangeWidth = 0.0, flangeThickness = 0.0; // of the beam: bf, tf, m
+    double columnFlange = 0.0;                       // tcf, m
+    double continuityPlate = 0.0;                    // thickness, m; 0: none
+    double panelRatio = 0.0;                         // Vpz / Vye
+    double slenderShare = 0.0;                       // of flange and web: 0 compact, 1 slender
+};
+
+/// a, b, c in rad; IO, LS, CP stay 0: say so to the backbone.
+std::optional<T_CODE_PLASTIC> AsceConnection(const T_FR_CONNECTION& c, CCodeSheet& sheet);
