@@ -2,7 +2,7 @@
 // walls. Strengths f are expected ones (lower-bound where the formula says so), in Pa.
 #pragma once
 
-#include "qm_rps/codes/codetable.h"
+#include "qm_rps/codes/codebackbone.h"
 
 /// ASCE 41-17; ASCE 41-13; FEMA 356 for primary and for secondary components.
 enum class ASCE_EDITION { Asce17, Asce13, Fema356Primary, Fema356Secondary };
@@ -97,3 +97,6 @@ struct T_ASCE_WALL_SHEAR {
     bool forceControlled = false; // P > 0.15 Ag f'c
 };
 std::optional<T_ASCE_WALL_SHEAR> AsceWallShear(const T_ASCE_WALL& wall, CCodeSheet& sheet);
+/// B at the drift g, where the strength is the yield strength; the elastic line ends at f of it.
+std::optional<T_CODE_BACKBONE> BackboneOfWallShear(const T_ASCE_WALL_SHEAR& wall, double yield,
+                                                   CCodeSheet& sheet);

@@ -104,3 +104,20 @@ std::optional<T_ASCE_WALL_SHEAR> AsceWallShear(const T_ASCE_WALL& wall, CCodeShe
     if (w.forceControlled) sheet.Warn("IDS_QM_CODE_WARN_FORCE", {kShearTable});
     return sheet.Sound() ? std::optional(w) : std::nullopt;
 }
+
+std::optional<T_CODE_BACKBONE> BackboneOfWallShear(const T_ASCE_WALL_SHEAR& wall, double yield,
+                                                   CCodeSheet& sheet)
+{
+    if (wall.forceControlled) {
+        sheet.Refuse(CODE_REASON::NoRow, "axial", kShearTable);
+        return {};
+    }
+    const T_CODE_PLASTIC beyondYield{wall.d - wall.g,  wall.e - wall.g,  wall.c,
+                                     wall.IO - wall.g, wall.LS - wall.g, wall.CP - wall.g};
+    T_BACKBONE_IN in;
+    in.yield = yield;
+    in.yieldDeform = wall.g;
+    std::optional<T_CODE_BACKBONE> bone = BackboneOfPlastic(beyondYield, in, sheet);
+    if (bone) bone->crackStrength = wall.f;
+    return bone;
+}

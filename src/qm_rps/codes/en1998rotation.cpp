@@ -133,7 +133,7 @@ std::optional<double> EnThetaY(const T_EN_MEMBER& m, THETA_Y form, double curvat
                        0.13 * curvature * slip,
                    "Circolare 2019 [C8.7.2.7b]",
                    "phi_y LV/3 + 0.002 (1 - 0.125 LV/h) + 0.13 phi_y dbL fy/sqrt(fc)", S1);
-    sheet.WarnConflict(kA10, "z = d - d'", "z = 0.9 d");
+    if (cracked) sheet.WarnConflict(kA10, "z = d - d'", "z = 0.9 d");
     const double bending = curvature * shifted / 3.0;
     if (m.wall)
         return put(bending + 0.0013 + curvature * slip / 8.0, "EN 1998-3 (A.11b)",

@@ -1,0 +1,29 @@
+#include "qm_rps/codes/en1998backbone.h"
+
+std::optional<T_EN_HINGE> EnHinge(const T_EN_HINGE_IN& in, CCodeSheet& sheet)
+{
+    const T_EN_MEMBER& m = in.member;
+    if (!sheet.NotNegative({{"concreteShear", in.concreteShear}})) return {};
+    const std::optional<T_EN_YIELD> yield = EnYield(m, sheet);
+    if (!yield) return {};
+    const bool cracked = in.concreteShear < yield->moment / m.shearSpan;
+    sheet.Put("aV", cracked ? 1.0 : 0.0, "EN 1998-3 A.3.2.4", "1: VRd,c < My/LV",
+              CODE_MARK::SightedTwice);
+    const THETA_Y own = m.wall ? THETA_Y::CircolareWall : THETA_Y::CircolareBeam;
+    const THETA_Y form = m.basis == EN_BASIS::Circolare2019 ? own : in.form;
+    const std::optional<double> thetaY = EnThetaY(m, form, yield->curvature, cracked, sheet);
+    const std::optional<double> thetaUm = EnThetaUm(m, sheet);
+    if (!thetaY || !thetaUm) return {};
+
+    std::optional<T_CHORD_LIMITS> limits = EnChordLimits(*thetaY, *thetaUm, m.basis, sheet);
+    if (!limits) return {};
+    limits->residual = in.residual;
+    T_BACKBONE_IN curve;
+    curve.yield = yield->moment;
+    curve.yieldDeform = *thetaY;
+    curve.slope = in.strengthCap > 1.0 ? 1.0 : 0.0; // up to the cap, which is reached at theta_um
+    curve.strengthCap = in.strengthCap;
+    const std::optional<T_CODE_BACKBONE> bone = BackboneOfChord(*limits, curve, sheet);
+    if (!bone) return {};
+    return T_EN_HINGE{*yield, *thetaY, *thetaUm, *bone};
+}

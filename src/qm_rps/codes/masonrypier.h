@@ -1,0 +1,40 @@
+// Piers of existing masonry: in-plane strength and drifts by NTC 2018 with the Circolare 2019, and
+// the drifts of EN 1998-3 Annex C.
+#pragma once
+
+#include "qm_rps/codes/codesheet.h"
+
+enum class MASONRY_BOND { Irregular, Regular };
+
+struct T_PIER {
+    double length = 0.0, thickness = 0.0, height = 0.0; // m
+    double shearSpan = 0.0;  // h0 = M / V at the section that is checked, m
+    double axial = 0.0;      // N, compression positive
+    double fm = 0.0;         // mean compressive strength, Pa
+    double tau0 = 0.0;       // mean shear strength, of the irregular bond
+    double fv0 = 0.0;        // mean shear strength without compression; 0: not given
+    double fb = 0.0;         // of the blocks, for the limit of fv; 0: not given
+    double confidence = 1.0; // CF: strengths are divided by it
+    MASONRY_BOND bond = MASONRY_BOND::Irregular;
+    double interlocking = 1.0; // phi of the regular bond
+    bool hollowBlocks = false; // modern hollow blocks: diagonal drift 0.004
+};
+
+enum class PIER_MODE { Flexure, Sliding, Diagonal };
+struct T_PIER_STRENGTH {
+    double moment = 0.0;             // Mu
+    double flexure = 0.0;            // Mu / h0
+    std::optional<double> sliding{}; // absent: fv0 is not given
+    double diagonal = 0.0;
+    PIER_MODE mode = PIER_MODE::Flexure;
+    double strength = 0.0; // the least
+    double drift = 0.0;    // ultimate, over the height, of the mode that governs
+};
+std::optional<T_PIER_STRENGTH> NtcPier(const T_PIER& pier, CCodeSheet& sheet);
+
+/// EN 1998-3 Annex C: drifts of SD and NC; H0 is the height to the inflection point, D the depth.
+struct T_PIER_DRIFTS {
+    double SD = 0.0, NC = 0.0;
+};
+std::optional<T_PIER_DRIFTS> AnnexCDrifts(double H0, double D, bool flexure, bool secondary,
+                                          CCodeSheet& sheet);
