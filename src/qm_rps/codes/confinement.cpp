@@ -112,8 +112,8 @@ std::optional<T_CONFINED> ManderRectangular(const T_RECT_CORE& core, const T_CON
     const double y =
         sheet.Put("fly", ke * ratioY * m.fyh, kDimStress, kMander, "ke Asy/(s bc) fyh", S2);
     if (std::fabs(x - y) > 0.01 * std::max(x, y))
-        sheet.WarnConflict(kMander, "fl' = sqrt(flx fly)", "fcc(flx, fly)");
-    std::optional<T_CONFINED> c = ManderConfined(std::sqrt(x * y), m, sheet);
+        sheet.WarnConflict(kMander, "fl' = (flx + fly)/2", "fcc(flx, fly); sqrt(flx fly)");
+    std::optional<T_CONFINED> c = ManderConfined((x + y) / 2.0, m, sheet);
     if (!c) return {};
     c->effectiveness = ke;
     PutManderUltimate(ratioX + ratioY, m, *c, sheet);

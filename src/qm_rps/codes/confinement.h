@@ -41,8 +41,8 @@ struct T_CONFINED_MATERIAL {
 /// Mander, Priestley, Park 1988: fcc from an effective lateral pressure; the strain with it.
 std::optional<T_CONFINED> ManderConfined(double pressure, const T_CONFINED_MATERIAL& m,
                                          CCodeSheet& sheet);
-/// `gaps` are clear distances between bars. Where the pressures of x and y differ, their geometric
-/// mean is taken, with a warning: Mander's chart for two pressures is not in here.
+/// `gaps` are clear distances between bars. Where the pressures of x and y differ, their mean is
+/// taken, with a warning: Mander's chart for two pressures is not in here.
 std::optional<T_CONFINED> ManderRectangular(const T_RECT_CORE& core, const T_CONFINED_MATERIAL& m,
                                             CCodeSheet& sheet);
 std::optional<T_CONFINED> ManderCircular(const T_ROUND_CORE& core, const T_CONFINED_MATERIAL& m,

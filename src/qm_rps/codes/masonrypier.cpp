@@ -41,9 +41,10 @@ double SlidingStrength(const T_PIER& p, CCodeSheet& sheet)
     };
     double v = solved(fv0, friction);
     if (p.fb > 0.0) v = std::min(v, solved(0.065 * p.fb / kGammaM, 0.0));
+    v = std::min(v, p.axial * p.length / (2.0 * p.shearSpan)); // nothing is compressed any more
     const double length = std::min(p.length, 3.0 * (p.length / 2.0 - v * p.shearSpan / p.axial));
     sheet.Put("l'", length, kDimLength, kSliding, "3 (l/2 - V h0/N) <= l", K);
-    return sheet.Put("Vs", v, kDimForce, kSliding, "l' t min(fv0 + 0.4 N/(l' t); 0.065 fb/0.7)",
+    return sheet.Put("Vs", v, kDimForce, kSliding, "l' t min(fv0 + 0.4 N/(l' t); 0.065 fb/0.7); l' >= 0",
                      S1);
 }
 
