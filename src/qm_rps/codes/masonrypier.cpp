@@ -44,8 +44,8 @@ double SlidingStrength(const T_PIER& p, CCodeSheet& sheet)
     v = std::min(v, p.axial * p.length / (2.0 * p.shearSpan)); // nothing is compressed any more
     const double length = std::min(p.length, 3.0 * (p.length / 2.0 - v * p.shearSpan / p.axial));
     sheet.Put("l'", length, kDimLength, kSliding, "3 (l/2 - V h0/N) <= l", K);
-    return sheet.Put("Vs", v, kDimForce, kSliding, "l' t min(fv0 + 0.4 N/(l' t); 0.065 fb/0.7); l' >= 0",
-                     S1);
+    return sheet.Put("Vs", v, kDimForce, kSliding,
+                     "l' t min(fv0 + 0.4 N/(l' t); 0.065 fb/0.7); l' >= 0", S1);
 }
 
 double IrregularStrength(const T_PIER& p, double stress, CCodeSheet& sheet)

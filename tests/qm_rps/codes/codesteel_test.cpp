@@ -12,8 +12,8 @@ namespace {
 
 using enum ASCE_EDITION;
 
-/// sqrt(E/Fye) = 24; slenderness of flange and web as given; L/ry = 60; theta_y = 0.01 without axial
-/// force.
+/// sqrt(E/Fye) = 24; slenderness of flange and web as given; L/ry = 60; theta_y = 0.01 without
+/// axial force.
 T_STEEL_MEMBER Member(double flange, double web, double p)
 {
     T_STEEL_MEMBER m;
@@ -90,21 +90,56 @@ TEST(AsceSteel, ColumnsByAxialForce)
     } kCases[] = {
         {"41-13 low: as beams", 24 * 0.34, 40, 0.1, Asce13, 0.009, {6.5, 8.5, 0.4, 0.625, 6, 7.5}},
         // u = 5/12; halfway between compact (11u 17u; 14u 17u) and slender (1 1.5; 0.5 0.8).
-        {"41-13", 24 * 0.34, 30, 0.35, Asce13, theta35,
+        {"41-13",
+         24 * 0.34,
+         30,
+         0.35,
+         Asce13,
+         theta35,
          {2.7916667, 4.2916667, 0.2, 0.25, 3.1666667, 3.9416667}},
-        {"FEMA 356, primary", 24 * 0.34, 30, 0.35, Fema356Primary, theta35,
+        {"FEMA 356, primary",
+         24 * 0.34,
+         30,
+         0.35,
+         Fema356Primary,
+         theta35,
          {2.7916667, 4.2916667, 0.2, 0.25, 1.9166667, 2.6916667}},
-        {"FEMA 356, secondary", 24 * 0.34, 30, 0.35, Fema356Secondary, theta35,
+        {"FEMA 356, secondary",
+         24 * 0.34,
+         30,
+         0.35,
+         Fema356Secondary,
+         theta35,
          {2.7916667, 4.2916667, 0.2, 0.25, 3.5166667, 4.1416667}},
         // Web limits 260/sqrt(29000) and 400/sqrt(29000), times 24: halfway at 46.50784.
-        {"41-13, web", 5, 46.50784, 0.35, Asce13, theta35,
+        {"41-13, web",
+         5,
+         46.50784,
+         0.35,
+         Asce13,
+         theta35,
          {2.7916667, 4.2916667, 0.2, 0.25, 3.1666667, 3.9416667}},
         // Table 9-7.1, worked apart from this code.
-        {"41-17 compact", 6, 40, 0.25, Asce17, 1.0,
+        {"41-17 compact",
+         6,
+         40,
+         0.25,
+         Asce17,
+         1.0,
          {0.00767998369, 0.0201528950, 0.675, 0.00383999184, 0.0151146712, 0.0201528950}},
-        {"41-17 slender", 6, 60, 0.25, Asce17, 1.0,
+        {"41-17 slender",
+         6,
+         60,
+         0.25,
+         Asce17,
+         1.0,
          {0.00660648596, 0.0338536119, 0.375, 0.00330324298, 0.0253902089, 0.0338536119}},
-        {"41-17 between", 6, 52.7184, 0.25, Asce17, 1.0,
+        {"41-17 between",
+         6,
+         52.7184,
+         0.25,
+         Asce17,
+         1.0,
          {0.00599685484, 0.0253345886, 0.525, 0.00299842742, 0.0190009414, 0.0253345886}},
     };
     for (const auto& c : kCases) {
@@ -240,7 +275,8 @@ TEST(SteelInteraction, PublishedCases)
     ExpectRel(14.00e-4, *EnShearArea(ipe, true, sheet), 1e-3, "Avz of the catalogue");
     // Design Example H.1B, W14x99: printed 0.928.
     ExpectRel(0.928, *AiscInteraction({1130, 642, 311}, {400, 250, 80}, sheet), 2e-3, "H1-1a");
-    ExpectRel(0.05 + 0.5, *AiscInteraction({1000, 100, 100}, {-100, 25, -25}, sheet), 1e-9, "H1-1b");
+    ExpectRel(0.05 + 0.5, *AiscInteraction({1000, 100, 100}, {-100, 25, -25}, sheet), 1e-9,
+              "H1-1b");
 }
 
 TEST(SteelInteraction, HandValues)
