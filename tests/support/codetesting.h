@@ -8,6 +8,7 @@
 #include <array>
 #include <cmath>
 #include <string>
+#include <type_traits>
 
 constexpr double kMpa = kPascalsPerMpa;
 
@@ -20,6 +21,14 @@ inline std::string Why(const CCodeSheet& sheet)
 inline void ExpectRel(double expected, double actual, double tol, const std::string& label)
 {
     EXPECT_NEAR(expected, actual, tol * std::fabs(expected) + 1e-12) << label;
+}
+
+/// A sound record with one member as given.
+template <class RECORD, class MEMBER>
+RECORD With(RECORD record, MEMBER RECORD::*member, std::type_identity_t<MEMBER> value)
+{
+    record.*member = value;
+    return record;
 }
 
 /// a, b, c, IO, LS, CP.

@@ -207,8 +207,7 @@ using REFUSAL = std::function<bool(CCodeSheet&)>;
 template <class RECORD, class MEMBER, class RUN>
 REFUSAL Spoilt(RECORD record, MEMBER RECORD::*member, MEMBER value, RUN run)
 {
-    record.*member = value;
-    return [=](CCodeSheet& sheet) { return !run(record, sheet); };
+    return [=, r = With(record, member, value)](CCodeSheet& sheet) { return !run(r, sheet); };
 }
 REFUSAL Beam(double T_ASCE_BEAM::*member, double value)
 {
