@@ -43,6 +43,15 @@ constexpr std::array<T_CODE_PLASTIC, 2> kTension{{{11.0, 14.0, 0.8, 0.25, 7.0, 9
                                                   {11.0, 14.0, 0.8, 0.25, 11.0, 13.0}}};
 // clang-format on
 
+T_STEEL_PLASTIC InElongations(const T_CODE_PLASTIC& p, const T_STEEL_BRACE& brace,
+                              const char* clause, CCodeSheet& sheet)
+{
+    return {brace.yieldDeform,
+            InYields(p, brace.yieldDeform, clause, brace.tension ? "Delta_T" : "Delta_c", sheet,
+                     kDimLength),
+            false};
+}
+
 } // namespace
 
 bool SoundSteel(const T_STEEL_MEMBER& m, CCodeSheet& sheet)
@@ -100,14 +109,15 @@ std::optional<T_STEEL_PLASTIC> AsceSteelBeam(const T_STEEL_MEMBER& m, ASCE_EDITI
                                   LinearClamped(web, 2.45, 0.0, 3.76, 1.0));
     const T_CODE_PLASTIC p = SteelBeamLadder(share, edition, clause, sheet);
     if (!sheet.Sound()) return {};
-    return T_STEEL_PLASTIC{*yield, Scaled(p, *yield), false};
+    return T_STEEL_PLASTIC{*yield, InYields(p, *yield, clause, "theta_y", sheet), false};
 }
 
 std::optional<T_STEEL_PLASTIC> AscePanelZone(double yieldAngle, CCodeSheet& sheet)
 {
     if (!sheet.Positive({{"yieldAngle", yieldAngle}})) return {};
     PutPlastic(kPanel, kBeam, "panel zone (theta_y)", R, sheet);
-    return T_STEEL_PLASTIC{yieldAngle, Scaled(kPanel, yieldAngle), false};
+    return T_STEEL_PLASTIC{yieldAngle, InYields(kPanel, yieldAngle, kBeam, "theta_y", sheet),
+                           false};
 }
 
 std::optional<T_STEEL_PLASTIC> AsceBrace(const T_STEEL_BRACE& brace, CCodeSheet& sheet)
@@ -117,7 +127,7 @@ std::optional<T_STEEL_PLASTIC> AsceBrace(const T_STEEL_BRACE& brace, CCodeSheet&
     if (brace.tension) {
         const T_CODE_PLASTIC& p = kTension[brace.primary ? 0 : 1];
         PutPlastic(p, kClause, "tension (Delta_T)", R, sheet);
-        return T_STEEL_PLASTIC{brace.yieldDeform, Scaled(p, brace.yieldDeform), false};
+        return InElongations(p, brace, kClause, sheet);
     }
     if (!sheet.Positive({{"slenderness", brace.slenderness}, {"Fy", brace.Fy}, {"E", brace.E}}))
         return {};
@@ -136,5 +146,5 @@ std::optional<T_STEEL_PLASTIC> AsceBrace(const T_STEEL_BRACE& brace, CCodeSheet&
                CodeNumber(1.0 - share) + " stocky + " + CodeNumber(share) + " slender (Delta_c)", R,
                sheet);
     if (!sheet.Sound()) return {};
-    return T_STEEL_PLASTIC{brace.yieldDeform, Scaled(p, brace.yieldDeform), false};
+    return InElongations(p, brace, kClause, sheet);
 }

@@ -156,7 +156,7 @@ std::optional<T_STEEL_PLASTIC> Column13(const T_STEEL_MEMBER& m, double yield, A
         v = Medium13(p, SlenderShare(plates, 260.0 / ksi, 400.0 / ksi), edition, sheet);
     }
     if (!sheet.Sound()) return {};
-    return T_STEEL_PLASTIC{yield, Scaled(v, yield), false};
+    return T_STEEL_PLASTIC{yield, InYields(v, yield, kTable13, "theta_y", sheet), false};
 }
 
 } // namespace

@@ -5,8 +5,8 @@
 
 namespace {
 
-constexpr const char* kCurve = "ASCE 41 7.4.3";
-constexpr const char* kChordCurve = "EN 1998-3 A.3.2";
+constexpr const char* kCurve = "ASCE 41";
+constexpr const char* kChordCurve = "EN 1998-3";
 
 bool SoundInput(const T_BACKBONE_IN& in, CCodeSheet& sheet)
 {
@@ -23,15 +23,31 @@ double StrengthAtC(const T_BACKBONE_IN& in, double plastic)
     return in.strengthCap > 0.0 ? std::min(risen, in.strengthCap) : risen;
 }
 
-void PutPoints(const T_CODE_BACKBONE& bone, const char* clause, CCodeSheet& sheet)
+void PutPoints(const T_CODE_BACKBONE& bone, const char* clause, T_DIM dim, CCodeSheet& sheet)
 {
+    constexpr auto K = CODE_MARK::Computed;
     const std::pair<const char*, const T_CODE_POINT*> points[] = {
         {"B", &bone.B}, {"C", &bone.C}, {"D", &bone.D}, {"E", &bone.E}};
     for (const auto& [name, point] : points) {
-        sheet.Put(std::string("D(") + name + ")", point->deform, clause, "", CODE_MARK::Computed);
-        sheet.Put(std::string("F(") + name + ")", point->strength, clause, "F / Fy",
-                  CODE_MARK::Computed);
+        sheet.Put(std::string("D(") + name + ")", point->deform, dim, clause, "", K);
+        sheet.Put(std::string("F(") + name + ")", point->strength, clause, "F / Fy", K);
     }
+    if (!bone.acceptance) return;
+    const bool fema = bone.levels == CODE_LEVELS::IoLsCp;
+    const std::array<const char*, 3> names =
+        fema ? std::array{"D(IO)", "D(LS)", "D(CP)"} : std::array{"D(DL)", "D(SD)", "D(NC)"};
+    for (std::size_t i = 0; i < names.size(); ++i)
+        sheet.Put(names[i], (*bone.acceptance)[i], dim, clause, "", K);
+}
+
+/// Point E after D; `plateau`: b lies beyond a.
+T_CODE_POINT EndOf(const T_CODE_BACKBONE& bone, bool plateau, double end, CCodeSheet& sheet)
+{
+    if (plateau) return {end, bone.D.strength};
+    if (bone.strengthLoss && bone.D.strength > 0.0) return {bone.D.deform, 0.0};
+    if (bone.D.strength > 0.0)
+        sheet.Warn("IDS_QM_CODE_WARN_CONTINUED", {kCurve, CodeNumber(bone.D.strength)});
+    return {kEndOverUltimate * bone.D.deform, bone.D.strength};
 }
 
 } // namespace
@@ -51,14 +67,15 @@ std::optional<T_CODE_BACKBONE> BackboneOfPlastic(const T_CODE_PLASTIC& p, const 
     bone.B = {y, 1.0};
     bone.C = {y + p.a, StrengthAtC(in, p.a)};
     bone.D = {y + p.a, p.c};
-    bone.E = {y + end, p.c};
+    bone.strengthLoss = p.c < bone.C.strength;
+    bone.E = EndOf(bone, p.b > p.a, y + end, sheet);
     if (in.acceptance)
         bone.acceptance = {{y + p.IO, y + p.LS, y + p.CP}};
     else
         sheet.Warn("IDS_QM_CODE_WARN_NO_ACCEPTANCE", {kCurve});
     bone.forceControlled = !(end > 0.0);
     if (bone.forceControlled) sheet.Warn("IDS_QM_CODE_WARN_FORCE", {kCurve});
-    PutPoints(bone, kCurve, sheet);
+    PutPoints(bone, kCurve, in.dim, sheet);
     return sheet.Sound() ? std::optional(bone) : std::nullopt;
 }
 
@@ -81,6 +98,6 @@ std::optional<T_CODE_BACKBONE> BackboneOfChord(const T_CHORD_LIMITS& limits,
     // Where 0.75 theta_u lies below theta_y, damage is significant before yield.
     bone.acceptance = {{std::min(limits.DL, limits.SD), limits.SD, limits.NC}};
     sheet.Warn("IDS_QM_CODE_WARN_CONTINUED", {kChordCurve, CodeNumber(limits.residual)});
-    PutPoints(bone, kChordCurve, sheet);
+    PutPoints(bone, kChordCurve, in.dim, sheet);
     return sheet.Sound() ? std::optional(bone) : std::nullopt;
 }

@@ -21,6 +21,7 @@ struct T_CODE_BACKBONE {
     double yieldDeform = 0.0; // at yield
     T_CODE_POINT B, C, D, E;
     std::optional<std::array<double, 3>> acceptance{}; // total; absent: the code has none
+    bool strengthLoss = true;                          // D lies below C
     bool forceControlled = false;                      // no plastic deformation may be counted on
     /// Of walls that shear controls: strength at cracking over the yield strength, on the elastic
     /// line; 0: none.
@@ -42,12 +43,15 @@ struct T_BACKBONE_IN {
     /// section); 0: not known.
     double strengthCap = 0.0;
     bool acceptance = true; // the table has acceptance values
+    T_DIM dim = kDimNone;   // of the deformations; a length of braces
 };
 inline constexpr double kConcreteSlope = 0.10;
 inline constexpr double kSteelSlope = 0.03;
 
-/// B (theta_y, 1), C (theta_y + a, 1 + slope a / theta_y), D (theta_y + a, c), E (theta_y + b, c);
-/// ASCE 41 7.4.3. b < a is taken as b = a; b = 0 is force-controlled.
+/// B (theta_y, 1), C (theta_y + a, 1 + slope a / theta_y), D (theta_y + a, c), E (theta_y + b, c).
+/// b <= a leaves no plateau from D to E: E is at D's deformation, without strength. Where there is
+/// no strength to lose there (c = 0, or c not below C), E is at kEndOverUltimate of D's
+/// deformation. b = 0 is force-controlled.
 std::optional<T_CODE_BACKBONE> BackboneOfPlastic(const T_CODE_PLASTIC& p, const T_BACKBONE_IN& in,
                                                  CCodeSheet& sheet);
 

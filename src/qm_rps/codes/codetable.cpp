@@ -133,8 +133,17 @@ T_CODE_PLASTIC Scaled(const T_CODE_PLASTIC& p, double factor)
 }
 
 void PutPlastic(const T_CODE_PLASTIC& p, std::string_view clause, std::string_view text,
-                CODE_MARK mark, CCodeSheet& sheet)
+                CODE_MARK mark, CCodeSheet& sheet, T_DIM dim)
 {
     for (const T_PLASTIC_MEMBER& m : kMembers)
-        sheet.Put(m.symbol, p.*m.member, clause, text, mark);
+        sheet.Put(m.symbol, p.*m.member, m.deformation ? dim : kDimNone, clause, text, mark);
+}
+
+T_CODE_PLASTIC InYields(const T_CODE_PLASTIC& multiples, double yieldDeform,
+                        std::string_view clause, std::string_view symbol, CCodeSheet& sheet,
+                        T_DIM dim)
+{
+    const T_CODE_PLASTIC p = Scaled(multiples, yieldDeform);
+    PutPlastic(p, clause, "x " + std::string(symbol), CODE_MARK::Computed, sheet, dim);
+    return p;
 }

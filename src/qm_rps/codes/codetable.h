@@ -44,6 +44,10 @@ T_CODE_PLASTIC LeastOf(const T_CODE_PLASTIC& p, const T_CODE_PLASTIC& q);
 T_CODE_PLASTIC Between(const T_CODE_PLASTIC& p, const T_CODE_PLASTIC& q, double weight);
 /// Every deformation times the factor; c stays.
 T_CODE_PLASTIC Scaled(const T_CODE_PLASTIC& p, double factor);
-/// a to CP as lines of the sheet.
+/// a to CP as lines of the sheet; `dim` is that of the deformations.
 void PutPlastic(const T_CODE_PLASTIC& p, std::string_view clause, std::string_view text,
-                CODE_MARK mark, CCodeSheet& sheet);
+                CODE_MARK mark, CCodeSheet& sheet, T_DIM dim = kDimNone);
+/// Multiples of a yield deformation as deformations, with their lines.
+T_CODE_PLASTIC InYields(const T_CODE_PLASTIC& multiples, double yieldDeform,
+                        std::string_view clause, std::string_view symbol, CCodeSheet& sheet,
+                        T_DIM dim = kDimNone);

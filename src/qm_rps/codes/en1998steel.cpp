@@ -40,8 +40,9 @@ std::optional<T_CHORD_LIMITS> EnSteelLimits(const T_EN_STEEL& steel, CCodeSheet&
         sheet.Refuse(CODE_REASON::NoRow, "sectionClass", kTable);
         return {};
     }
+    const T_DIM dim = steel.action == STEEL_ACTION::Bending ? kDimNone : kDimLength;
     const auto total = [&](const char* symbol, double multiple) {
-        return sheet.Put(symbol, (1.0 + multiple) * steel.yieldDeform, kTable,
+        return sheet.Put(symbol, (1.0 + multiple) * steel.yieldDeform, dim, kTable,
                          std::string(row->text) + ": 1 + " + CodeNumber(multiple),
                          CODE_MARK::Recalled);
     };

@@ -88,6 +88,11 @@ TEST(AsceConcrete, BeamRowsAndTheirMiddle)
          {0.015, 0.03, 0.2, 0.01, 0.02, 0.03}},
         {"356 primary C", middle, Primary, {0.02, 0.035, 0.2, 0.00625, 0.01125, 0.02}},
         {"356 primary NC", open, Primary, {0.01125, 0.0175, 0.2, 0.00325, 0.0075, 0.01125}},
+        {"356 primary ii", shear, Primary, {0.003, 0.02, 0.2, 0.0015, 0.002, 0.003}},
+        {"356 primary iii", With(shear, &B::poorSplice, true), Primary,
+         {0.003, 0.02, 0.0, 0.0015, 0.002, 0.003}},
+        {"356 primary iv", With(middle, &B::poorEmbedment, true), Primary,
+         {0.015, 0.03, 0.2, 0.00625, 0.01, 0.015}},
         {"356 secondary", middle, Secondary, {0.02, 0.035, 0.2, 0.00625, 0.02, 0.035}},
     };
     // clang-format on

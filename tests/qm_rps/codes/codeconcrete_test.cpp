@@ -152,7 +152,7 @@ TEST(CodeBackbone, PointsAndAcceptance)
 {
     CCodeSheet sheet;
     const T_CODE_PLASTIC p{0.02, 0.035, 0.2, 0.005, 0.02, 0.03};
-    T_BACKBONE_IN in{300e3, 0.005, kConcreteSlope, 0.0, true};
+    T_BACKBONE_IN in{300e3, 0.005, kConcreteSlope};
     auto bone = BackboneOfPlastic(p, in, sheet);
     ASSERT_TRUE(bone) << Why(sheet);
     EXPECT_DOUBLE_EQ(0.025, bone->C.deform);
@@ -170,9 +170,20 @@ TEST(CodeBackbone, PointsAndAcceptance)
     EXPECT_FALSE(bone->acceptance);
     EXPECT_TRUE(Warns(sheet, "IDS_QM_CODE_WARN_NO_ACCEPTANCE"));
     EXPECT_TRUE(BackboneOfPlastic({}, in, sheet)->forceControlled);
+    // Without a plateau: strength lost at D; none left; none lost (panel zone).
+    const struct {
+        double c, slope, endDeform, endStrength;
+    } kEnds[] = {{0.2, 0.1, 0.025, 0.0}, {0.0, 0.1, 0.0375, 0.0}, {1.0, 0.0, 0.0375, 1.0}};
+    for (const auto& k : kEnds) {
+        in.slope = k.slope;
+        bone = BackboneOfPlastic({0.02, 0.02, k.c, 0.0, 0.0, 0.0}, in, sheet);
+        EXPECT_NEAR(k.endDeform, bone->E.deform, 1e-12);
+        EXPECT_DOUBLE_EQ(k.endStrength, bone->E.strength);
+        EXPECT_EQ(k.c < 1.0, bone->strengthLoss);
+    }
 
     // Yield later than 0.75 theta_u: DL comes no later than SD.
-    in = {300e3, 0.01, 0.0, 0.0, true};
+    in = {300e3, 0.01};
     bone = BackboneOfChord({0.01, 0.009, 0.012, 0.1}, in, sheet);
     EXPECT_DOUBLE_EQ(0.009, bone->acceptance->at(0));
     EXPECT_DOUBLE_EQ(0.1, bone->D.strength);
