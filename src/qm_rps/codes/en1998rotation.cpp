@@ -101,6 +101,8 @@ bool SoundMember(const T_EN_MEMBER& m, CCodeSheet& sheet)
     sheet.NotNegative({{"diagonalRatio", m.diagonalRatio}, {"lapRatio", m.lapRatio}});
     if (sheet.Sound()) sheet.Within("d", m.d, m.dPrime * (1.0 + 1e-9), m.h);
     sheet.Within("alpha", m.alpha, 0.0, 1.0);
+    if (m.smoothBars && m.basis == EN_BASIS::En1998) // its factors are not known to us
+        sheet.Refuse(CODE_REASON::NoRow, "smoothBars", "EN 1998-3 A.3.2.2(5)");
     sheet.Finite({{"axial", m.axial}});
     if (sheet.Sound()) sheet.Within("axial", m.axial, -kAnyValue, m.b * m.h * m.fc);
     return sheet.Sound();

@@ -24,7 +24,7 @@ struct T_EN_MEMBER {
     bool secondary = false;     // gamma_el = 1
     bool seismicDetails = true; // else the factor for old detailing
     double lapRatio = 0.0;      // lo / dbL of bars lapped at the end; 0: none
-    bool smoothBars = false;
+    bool smoothBars = false;    // Circolare alone
     EN_BASIS basis = EN_BASIS::En1998;
 };
 
