@@ -84,6 +84,8 @@ TEST(AsceConcrete, BeamRowsAndTheirMiddle)
          {0.003, 0.02, 0.0, 0.0015, 0.01, 0.02}},
         {"i with iii wide", With(Beam(0.3, 0.0, 3.0), &B::poorSplice, true), Asce17,
          {0.003, 0.01, 0.0, 0.0015, 0.005, 0.01}},
+        {"i with iii close", With(Beam(0.2, 0.0, 3.0), &B::poorSplice, true), Asce17,
+         {0.003, 0.02, 0.0, 0.0015, 0.01, 0.02}},
         {"i with iv", With(corner, &B::poorEmbedment, true), Asce17,
          {0.015, 0.03, 0.2, 0.01, 0.02, 0.03}},
         {"356 primary C", middle, Primary, {0.02, 0.035, 0.2, 0.00625, 0.01125, 0.02}},

@@ -125,6 +125,8 @@ TEST(CodeConcrete, ShearAndTwoMoments)
     v = EnShear(s, {}, sheet);
     ExpectRel(85.9199e3 + 56.25e3, v->concrete, 1e-5, "with axial force");
     ExpectRel(607.5e3 * 1.15, v->strut, 1e-9, "a_cw");
+    s.axial = 0.75 * 0.18 * 25 * kMpa / 1.5; // 2.5 (1 - 0.75)
+    ExpectRel(607.5e3 * 0.625, EnShear(s, {}, sheet)->strut, 1e-9, "a_cw, high");
 
     // 12 x 20 in, f'c 4000 psi, #3 at 10 in, 60 ksi: 30357.9 lb and 26400 lb. Without hoops, rho 1
     // %, size sqrt(2/3): 8 0.816497 0.215443 63.2456 240 = 21361 lb.
