@@ -64,7 +64,8 @@ struct T_SECTION_BAR {
 /// How far a section may be strained at its capacity.
 enum class PIVOT_RULE {
     /// EN 1992-1-1 6.1: limit of the steel (pivot A), limitStrain of the concrete at its edge (B),
-    /// peakStrain at 1 - peakStrain / limitStrain of the depth of a region (C).
+    /// and for a parabola-rectangle peakStrain at 1 - peakStrain / limitStrain of the depth of its
+    /// region (C).
     Eurocode,
     CrushOnly, // ACI 318-19 22.2.2.1: limitStrain of the concrete at its edge; limits of the steel
 };

@@ -39,7 +39,8 @@ inline auto Numbers(const T_SECTION_RESPONSE& r)
 }
 
 /// A state of capacity. Where the forces jump while the neutral axis moves (a bar at the edge of a
-/// block), the point lies on the straight line over the jump; plane and fibre are those of one side.
+/// block), the point lies on the straight line over the jump; plane and fibre are those of one
+/// side.
 struct T_CAPACITY {
     double axial = 0.0, My = 0.0, Mz = 0.0;
     T_STRAIN_PLANE plane; // of a plastic section: the sides of the neutral axis alone
@@ -60,8 +61,8 @@ struct T_AXIAL_CURVE {
 
 /// How a moment-curvature ends.
 enum class CURVATURE_END {
-    StrainLimit,  // a fibre reached its limit
-    MomentLoss,   // the moment fell to 80 % of the largest
+    StrainLimit,   // a fibre reached its limit
+    MomentLoss,    // the moment fell to 80 % of the largest
     NoEquilibrium, // beyond it the axial force is no longer carried
     MaxCurvature,  // as asked
 };
@@ -96,23 +97,23 @@ inline auto Numbers(const T_MOMENT_CURVATURE& m)
 enum class SECTION_FAULT {
     None,
     NoRegion,
-    NotFinite,        // a number of law, region and ring, bar, or of the request
-    NoSuchLaw,        // region or bar
-    LawStrength,      // law: strength or modulus not above 0
-    LawStrains,       // law: strains, exponent, hardening or depth of block out of their range
-    WrongLaw,         // bar: not of steel
-    RingArea,         // region, ring: without area
-    RingCrossed,      // region, ring: meets itself or another ring of the region
-    HoleOutside,      // region, ring: not within its outline
-    BarArea,          // bar: not above 0
-    BarOutside,       // bar: in no region of concrete
-    BarsOverlap,      // bar, otherBar
-    ConcretePlastic,  // region: full plasticity is for steel
-    NoLimit,          // law: nothing ends its strains, so that there is no capacity
-    BlockCurvature,   // law: a block gives no moment-curvature
-    AxialBeyond,      // axialMin, axialMax: what can be carried
-    NoSuchMoment,     // no capacity with this direction of the moment at this axial force
-    PointsTooFew,     // of a curve or surface: at least kFewestPoints
+    NotFinite,       // a number of law, region and ring, bar, or of the request
+    NoSuchLaw,       // region or bar
+    LawStrength,     // law: strength or modulus not above 0
+    LawStrains,      // law: strains, exponent, hardening or depth of block out of their range
+    WrongLaw,        // bar: not of steel
+    RingArea,        // region, ring: without area
+    RingCrossed,     // region, ring: meets itself or another ring of the region
+    HoleOutside,     // region, ring: not within its outline
+    BarArea,         // bar: not above 0
+    BarOutside,      // bar: in no region of concrete
+    BarsOverlap,     // bar, otherBar
+    ConcretePlastic, // region: full plasticity is for steel
+    NoLimit,         // law: nothing ends its strains, so that there is no capacity
+    BlockCurvature,  // law: a block gives no moment-curvature
+    AxialBeyond,     // axialMin, axialMax: what can be carried
+    NoSuchMoment,    // no capacity with this direction of the moment at this axial force
+    PointsTooFew,    // of a curve or surface: at least kFewestPoints
     NotConverged,
 };
 struct T_SECTION_ERROR {

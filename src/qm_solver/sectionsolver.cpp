@@ -187,7 +187,7 @@ int CSectionSolver::MomentCurvature(const T_CURVATURE_REQUEST& request, T_MOMENT
                                     T_SECTION_ERROR& error) const
 {
     if (!Ready(m_state ? &m_state->path : nullptr, error, request.axial, request.direction,
-                       request.maxCurvature))
+               request.maxCurvature))
         return 0;
     // Something must end the path: a limit of strain, or what was asked for.
     if (!(request.maxCurvature > 0.0) && CSectionView(m_state->shape).Limits().empty())

@@ -1,6 +1,6 @@
 // The section calculator: response, capacities and moment-curvature of a cross-section of concrete,
-// bars and steel. Plane sections. Integration is exact for the laws (piecewise polynomials in closed
-// form, powers by quadrature to 1e-10), over straight edges and circles alike.
+// bars and steel. Plane sections. Integration is exact for the laws (piecewise polynomials in
+// closed form, powers by quadrature to 1e-10), over straight edges and circles alike.
 #pragma once
 
 #include "qm_solver/sectionresult.h"

@@ -10,16 +10,16 @@ namespace solver {
 
 namespace {
 
-constexpr double kTol = 1e-11;       // of the balance, over the scale of the forces
+constexpr double kTol = 1e-11; // of the balance, over the scale of the forces
 constexpr int kNewtonSteps = 40;
 constexpr int kHalvings = 12;
 constexpr int kMarchSteps = 2000;
 constexpr int kUniformSteps = 64;
-constexpr double kFirstStep = 0.05;  // of the least curvature that yields
-constexpr double kGrowth = 0.04;     // of a step, over the curvature
-constexpr double kLoss = 0.8;        // of the largest moment
+constexpr double kFirstStep = 0.05;   // of the least curvature that yields
+constexpr double kGrowth = 0.04;      // of a step, over the curvature
+constexpr double kLoss = 0.8;         // of the largest moment
 constexpr double kBeyondYield = 20.0; // uniform tension of steel without a limit
-constexpr double kStuck = 1e-7;      // a step over the curvature: nothing holds beyond
+constexpr double kStuck = 1e-7;       // a step over the curvature: nothing holds beyond
 
 } // namespace
 
@@ -126,7 +126,7 @@ CCurvaturePath::T_REACHED CCurvaturePath::Reached(const std::vector<T_MARK>& mar
     T_REACHED out;
     for (const T_MARK& mark : marks) {
         const double part = (e0 + kappa * mark.s) / mark.strain;
-        if (!mark.pivotC && part > out.part) out = {part, mark.fibre};
+        if (part > out.part) out = {part, mark.fibre};
     }
     return out;
 }
@@ -158,9 +158,8 @@ std::vector<double> CCurvaturePath::UniformStrains() const
         high = std::max(high, kBeyondYield * mark.strain);
     }
     for (const T_MARK& mark : m_view.Limits())
-        (mark.strain > 0.0 ? highEnd : lowEnd) = mark.strain > 0.0
-                                                     ? std::min(highEnd, mark.strain)
-                                                     : std::max(lowEnd, mark.strain);
+        (mark.strain > 0.0 ? highEnd : lowEnd) =
+            mark.strain > 0.0 ? std::min(highEnd, mark.strain) : std::max(lowEnd, mark.strain);
     low = std::max(low, lowEnd), high = std::min(high, highEnd);
     for (int i = 0; i <= kUniformSteps; ++i)
         out.push_back(low + (high - low) * i / kUniformSteps);
@@ -207,24 +206,24 @@ bool CCurvaturePath::Start(T_STATE& first, T_SECTION_ERROR& error)
 // ---- march --------------------------------------------------------------------------------------
 
 template <class F>
-std::optional<CCurvaturePath::T_STATE>
-CCurvaturePath::Locate(const T_STATE& before, const T_STATE& after, const F& value)
+std::optional<CCurvaturePath::T_STATE> CCurvaturePath::Locate(const T_STATE& before,
+                                                              const T_STATE& after, const F& value)
 {
     std::optional<T_STATE> found = after;
     const auto at = [&](double curvature) {
         found = Solve(before, curvature);
         return found ? value(*found) : std::numeric_limits<double>::quiet_NaN();
     };
-    const T_BRACKET root = BracketRoot(at, before.at.along, value(before), after.at.along,
-                                       value(after), kTol);
+    const T_BRACKET root =
+        BracketRoot(at, before.at.along, value(before), after.at.along, value(after), kTol);
     return Solve(before, root.x);
 }
 
 /// The largest moment near the best state of the path, by golden section.
 double CCurvaturePath::LargestMoment()
 {
-    const auto best = std::ranges::max_element(
-        m_path, {}, [](const T_STATE& s) { return s.point.moment; });
+    const auto best =
+        std::ranges::max_element(m_path, {}, [](const T_STATE& s) { return s.point.moment; });
     const T_STATE& from = best == m_path.begin() ? *best : *(best - 1);
     double lo = from.at.along, hi = (best + 1 == m_path.end() ? best : best + 1)->at.along;
     double largest = best->point.moment;
@@ -254,8 +253,8 @@ bool CCurvaturePath::EndsAt(const T_STATE& state, T_MOMENT_CURVATURE& out)
         out.governs = state.limit.fibre;
         end = Locate(m_path.back(), state, [](const T_STATE& s) { return s.limit.part - 1.0; });
     } else {
-        const auto best = std::ranges::max_element(
-            m_path, {}, [](const T_STATE& s) { return s.point.moment; });
+        const auto best =
+            std::ranges::max_element(m_path, {}, [](const T_STATE& s) { return s.point.moment; });
         if (!(state.point.moment < kLoss * best->point.moment)) return false;
         const double left = kLoss * LargestMoment();
         out.end = CURVATURE_END::MomentLoss;
@@ -300,14 +299,14 @@ bool CCurvaturePath::March(T_MOMENT_CURVATURE& out)
 bool CCurvaturePath::Fill(T_MOMENT_CURVATURE& out)
 {
     T_STATE yield = m_path.back();
-    const auto first = std::ranges::find_if(
-        m_path, [](const T_STATE& s) { return s.yield.part >= 1.0; });
+    const auto first =
+        std::ranges::find_if(m_path, [](const T_STATE& s) { return s.yield.part >= 1.0; });
     if (first != m_path.end()) {
         yield = *first;
         out.yields = first->yield.fibre;
         if (first != m_path.begin()) {
-            const auto at = Locate(*(first - 1), *first,
-                                   [](const T_STATE& s) { return s.yield.part - 1.0; });
+            const auto at =
+                Locate(*(first - 1), *first, [](const T_STATE& s) { return s.yield.part - 1.0; });
             if (!at) return false;
             yield = *at;
         }

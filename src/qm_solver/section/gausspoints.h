@@ -10,9 +10,8 @@ struct T_GAUSS_POINT {
 };
 
 /// Exact to degree 5.
-inline constexpr std::array<T_GAUSS_POINT, 3> kGauss3{{{0.5, 4.0 / 9.0},
-                                                       {0.1127016653792583, 5.0 / 18.0},
-                                                       {0.8872983346207417, 5.0 / 18.0}}};
+inline constexpr std::array<T_GAUSS_POINT, 3> kGauss3{
+    {{0.5, 4.0 / 9.0}, {0.1127016653792583, 5.0 / 18.0}, {0.8872983346207417, 5.0 / 18.0}}};
 
 /// Exact to degree 31; half of the points, the others mirror them about 0.5.
 inline constexpr std::array<T_GAUSS_POINT, 8> kHalfGauss16{

@@ -104,6 +104,19 @@ double ExtentOf(const T_RING& ring)
     return extent;
 }
 
+namespace {
+
+/// Whether a point lies to the right of the chord from a to b. One on it counts as shifted towards
+/// +y, and by less towards +z, so that of two chords there and back it is right of one.
+bool RightOf(const T_CORNER& a, const T_CORNER& b, double y, double z)
+{
+    const double turn = Turn(a, b, y, z);
+    if (turn != 0.0) return turn < 0.0;
+    return a.z == b.z ? b.y < a.y : b.z > a.z;
+}
+
+} // namespace
+
 bool Within(const T_RING& ring, double y, double z)
 {
     bool in = false;
@@ -115,7 +128,7 @@ bool Within(const T_RING& ring, double y, double z)
         // Between chord and arc inside and outside change places; the arc bulges to the right of
         // its chord when it turns left.
         const T_BULGE arc = BulgeOf(a, b);
-        const bool beyond = a.bulge > 0.0 ? Turn(a, b, y, z) < 0.0 : Turn(a, b, y, z) >= 0.0;
+        const bool beyond = RightOf(a, b, y, z) == (a.bulge > 0.0);
         if (beyond && std::hypot(y - arc.y, z - arc.z) < arc.radius) in = !in;
     }
     return in;

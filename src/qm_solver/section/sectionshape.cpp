@@ -10,8 +10,8 @@ namespace solver {
 
 namespace {
 
-constexpr double kLeastArea = 1e-12;  // of a ring, over the square of its extent
-constexpr double kTouching = 1e-9;    // bars may touch; part of the distance
+constexpr double kLeastArea = 1e-12;   // of a ring, over the square of its extent
+constexpr double kTouching = 1e-9;     // bars may touch; part of the distance
 constexpr double kLargestStrain = 1.0; // of a law
 
 bool FiniteLaw(const T_STRESS_LAW& l)
@@ -68,8 +68,8 @@ bool CheckRing(const T_RING& ring, T_SECTION_ERROR& error)
     for (std::size_t i = 2; i < ring.size() && flat; ++i)
         flat = std::fabs(AreaOf({ring[0], ring[1], ring[i]})) <= least;
     if (flat) return Set(error, SECTION_FAULT::RingArea);
-    return Set(error, Crossing(ring, ring, true) ? SECTION_FAULT::RingCrossed
-                                                 : SECTION_FAULT::None);
+    return Set(error,
+               Crossing(ring, ring, true) ? SECTION_FAULT::RingCrossed : SECTION_FAULT::None);
 }
 
 bool CheckRegion(const T_SECTION_REGION& region, T_SECTION_ERROR& error)

@@ -36,8 +36,8 @@ void CSectionView::Turn(double direction)
     for (const T_ARC& a : m_shape.arcs)
         AddBow(a);
     for (const T_SHAPE_BAR& b : m_shape.bars)
-        m_points.push_back({b.y * m_sin + b.z * m_cos, b.z * m_sin - b.y * m_cos, b.area, b.law,
-                            b.host});
+        m_points.push_back(
+            {b.y * m_sin + b.z * m_cos, b.z * m_sin - b.y * m_cos, b.area, b.law, b.host});
     Mark();
 }
 
@@ -117,7 +117,7 @@ void CSectionView::MarkRegion(std::size_t r)
     m_limits.push_back({high, law.limitStrain, edge});
     if (law.kind == STRESS_LAW::Block) return;
     m_yields.push_back({high, law.peakStrain, edge});
-    if (m_shape.model.pivot != PIVOT_RULE::Eurocode) return;
+    if (m_shape.model.pivot != PIVOT_RULE::Eurocode || law.kind == STRESS_LAW::Mander) return;
     const double down = (1.0 - law.peakStrain / law.limitStrain) * (high - low);
     m_limits.push_back({high - down, law.peakStrain, edge, true});
 }
@@ -138,7 +138,8 @@ void CSectionView::MarkBars()
 
 // ---- sums ---------------------------------------------------------------------------------------
 // By Green's theorem the sum of f(s) t^k over a region is minus that of f(s) t^(k+1) / (k+1) ds
-// around its outline. Each way is cut where its strain passes from one piece of the law to the next.
+// around its outline. Each way is cut where its strain passes from one piece of the law to the
+// next.
 
 namespace {
 
@@ -154,8 +155,8 @@ void AddPlace(const CStressLaw& law, const T_LAW_PIECE& piece, double strain, do
     sums.overT += stress * overT;
     if constexpr (kTangent) {
         const double slope = law.Tangent(piece, strain);
-        const std::array<double, 6> parts{area,     area * s,  overT, area * s * s,
-                                          overT * s, overT * t * (2.0 / 3.0)};
+        const std::array<double, 6> parts{area,         area * s,  overT,
+                                          area * s * s, overT * s, overT * t * (2.0 / 3.0)};
         for (std::size_t i = 0; i < parts.size(); ++i)
             sums.tangent[i] += slope * parts[i];
     }
@@ -232,14 +233,16 @@ void CSectionView::SumBow(const T_BOW& bow, double e0, double kappa, T_SUMS& sum
                 ForGauss16([&](double at, double w) { add(a + (b - a) * at, (b - a) * w); });
             else {
                 const double c = 0.5 * (a + b); // two panels: strains bend at 0 and pi
-                const bool atB = std::fabs(angle(piece.root) - b) < std::fabs(angle(piece.root) - a);
+                const bool atB =
+                    std::fabs(angle(piece.root) - b) < std::fabs(angle(piece.root) - a);
                 ForGathered(a, c, atB, add);
                 ForGathered(c, b, atB, add);
             }
         }
     };
     for (int k = 0; k < 4; ++k) {
-        const double from = std::max(bow.from, k * pi), to = std::min(bow.from + bow.sweep, (k + 1) * pi);
+        const double from = std::max(bow.from, k * pi),
+                     to = std::min(bow.from + bow.sweep, (k + 1) * pi);
         if (!(from < to)) continue;
         if (k % 2 == 0)
             half(from - k * pi, to - k * pi, 1.0);

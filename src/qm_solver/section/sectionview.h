@@ -17,7 +17,7 @@ struct T_SUMS {
 struct T_MARK {
     double s = 0.0, strain = 0.0;
     T_FIBRE fibre;
-    bool pivotC = false; // no limit of the fibre but of the plane, see PIVOT_RULE
+    bool pivotC = false; // lies within its region, see PIVOT_RULE
 };
 
 class CSectionView {

@@ -11,9 +11,9 @@ namespace solver {
 namespace {
 
 constexpr std::size_t kSamples = 65;
-constexpr double kAxialTol = 1e-12;   // of an axial force, over the range of them
-constexpr double kPlaceTol = 1e-11;   // of the largest moment, whose curve is flat there
-constexpr double kAllTension = -1e3;  // a strain that all steel yields at
+constexpr double kAxialTol = 1e-12;  // of an axial force, over the range of them
+constexpr double kPlaceTol = 1e-11;  // of the largest moment, whose curve is flat there
+constexpr double kAllTension = -1e3; // a strain that all steel yields at
 constexpr int kMaxIterations = 200;
 constexpr double kEndless = std::numeric_limits<double>::infinity();
 
@@ -159,8 +159,8 @@ CUltimateStates::T_RANGE CUltimateStates::AxialRange()
 
 double CUltimateStates::Peak()
 {
-    const auto best = std::ranges::max_element(
-        Samples(), {}, [this](const T_CAPACITY& c) { return Moment(c); });
+    const auto best =
+        std::ranges::max_element(Samples(), {}, [this](const T_CAPACITY& c) { return Moment(c); });
     const std::size_t at = static_cast<std::size_t>(best - m_samples.begin());
     constexpr double kGolden = 1.0 / std::numbers::phi;
     double lo = PlaceOf(at ? at - 1 : 0), hi = PlaceOf(std::min(at + 1, kSamples - 1));
@@ -184,8 +184,7 @@ T_CAPACITY CUltimateStates::Between(double axial, double a, const T_CAPACITY& at
 {
     const double tol = kAxialTol * std::fabs(m_compression.axial - m_tension.axial);
     const auto miss = [&](double place) { return At(place).axial - axial; };
-    const T_BRACKET root =
-        BracketRoot(miss, a, atA.axial - axial, b, atB.axial - axial, tol);
+    const T_BRACKET root = BracketRoot(miss, a, atA.axial - axial, b, atB.axial - axial, tol);
     const T_CAPACITY found = At(root.x);
     if (std::fabs(root.f) <= tol) return found;
     return Mixed(found, At(root.other), root.f / (root.f - root.fOther)); // over the jump
