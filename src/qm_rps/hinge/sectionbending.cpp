@@ -1,181 +1,154 @@
 #include "qm_rps/hinge/sectionbending.h"
 
 #include <algorithm>
-#include <array>
 #include <cmath>
+#include <numbers>
 
 namespace {
 
-// ---- steel: plastic neutral axis at +-a --------------------------------------------------------
+using namespace solver;
 
-/// Area of a piece within |t| <= a.
-double AreaWithin(const T_SECT_PIECE& p, double a)
+T_RING Rectangle(double width, double depth)
 {
-    const double r = p.depth / 2.0, b = std::min(a, r);
-    if (!p.round) return p.width * 2.0 * b;
-    return 2.0 * (b * std::sqrt(r * r - b * b) + r * r * std::asin(b / r));
+    const double y = width / 2.0, z = depth / 2.0;
+    return {{-y, -z}, {y, -z}, {y, z}, {-y, z}};
 }
 
-/// First moment of a piece beyond |t| >= a, both sides added.
-double MomentBeyond(const T_SECT_PIECE& p, double a)
+T_RING Circle(double diameter)
 {
-    const double r = p.depth / 2.0, b = std::min(a, r);
-    const double rest = r * r - b * b;
-    return p.round ? 4.0 / 3.0 * rest * std::sqrt(rest) : p.width * rest;
+    return {{diameter / 2.0, 0.0, 1.0}, {-diameter / 2.0, 0.0, 1.0}};
 }
 
-class CSteelBending : public ISectionBending {
-public:
-    CSteelBending(std::vector<T_SECT_PIECE> pieces, double fy)
-        : m_pieces(std::move(pieces)), m_fy(fy), m_depth(m_pieces.front().depth)
-    {
+/// Height a, width b, web c, flanges d.
+T_RING IShape(double a, double b, double c, double d)
+{
+    const double y = b / 2.0, w = c / 2.0, z = a / 2.0, f = z - d;
+    return {{-y, -z}, {y, -z}, {y, -f}, {w, -f}, {w, f},   {y, f},
+            {y, z},   {-y, z}, {-y, f}, {-w, f}, {-w, -f}, {-y, -f}};
+}
+
+/// Outline and hollow; none of a section given by values.
+std::vector<T_RING> Rings(const T_SECT_D& section)
+{
+    const auto& [a, b, c, d] = section.size;
+    switch (section.shape) {
+    case SECT_SHAPE::Rectangle:
+        return {Rectangle(b, a)};
+    case SECT_SHAPE::Circle:
+        return {Circle(a)};
+    case SECT_SHAPE::Pipe:
+        return {Circle(a), Circle(a - 2.0 * b)};
+    case SECT_SHAPE::Box:
+        return {Rectangle(b, a), Rectangle(b - 2.0 * c, a - 2.0 * d)};
+    case SECT_SHAPE::IShape:
+        return {IShape(a, b, c, d)};
+    case SECT_SHAPE::Value:
+        break;
     }
-    T_AXIAL_MOMENT At(double u) const override
-    {
-        const double a = std::fabs(u - 1.0) * m_depth / 2.0;
-        T_AXIAL_MOMENT r;
-        for (const T_SECT_PIECE& p : m_pieces) {
-            r.axial += p.sign * m_fy * AreaWithin(p, a);
-            r.moment += p.sign * m_fy * MomentBeyond(p, a);
-        }
-        if (u < 1.0) r.axial = -r.axial;
-        return r;
-    }
+    return {};
+}
 
-private:
-    std::vector<T_SECT_PIECE> m_pieces; // the first one is the deepest
-    double m_fy, m_depth;
-};
+T_STRESS_LAW SteelLaw(double strength, double modulus)
+{
+    T_STRESS_LAW law;
+    law.kind = STRESS_LAW::Steel;
+    law.strength = strength;
+    law.modulus = modulus;
+    return law;
+}
 
-/// Straight interaction of a section without a shape.
-class CLinearBending : public ISectionBending {
-public:
-    CLinearBending(double axial, double moment) : m_axial(axial), m_moment(moment) {}
-    T_AXIAL_MOMENT At(double u) const override
-    {
-        return {(u - 1.0) * m_axial, (1.0 - std::fabs(u - 1.0)) * m_moment};
-    }
+T_SECTION_MODEL ConcreteModel(const T_SECT_D& section, const T_MATL_D& material,
+                              const T_CONCRETE_LAW& law)
+{
+    T_STRESS_LAW concrete;
+    concrete.strength = material.fck;
+    concrete.peakStrain = law.peakStrain;
+    concrete.limitStrain = law.crushStrain;
+    concrete.exponent = law.n;
+    T_SECTION_MODEL model;
+    model.laws = {concrete, SteelLaw(material.fyk, material.Es)};
+    model.regions = {{Rings(section), 0}};
+    model.lumped = true;
+    for (const T_REBAR& bar : section.bars)
+        model.bars.push_back({bar.y, bar.z, bar.area, 1});
+    return model;
+}
 
-private:
-    double m_axial, m_moment;
-};
-
-// ---- concrete: strain compatibility ------------------------------------------------------------
-
-/// Gauss-Legendre points and weights on -1 ... 1, exact to degree 9.
-constexpr std::array<std::array<double, 2>, 5> kGauss{{{0.0, 0.5688888888888889},
-                                                       {-0.5384693101056831, 0.4786286704993665},
-                                                       {0.5384693101056831, 0.4786286704993665},
-                                                       {-0.9061798459386640, 0.2369268850561891},
-                                                       {0.9061798459386640, 0.2369268850561891}}};
-/// Panels per piece (plateau, parabola): measured against adaptive quadrature with 30 digits (C30
-/// to C90, circle and rectangle, neutral axis in and outside), forces and moments agree to 1e-9 of
-/// the force and force times depth. A rectangle of concrete up to C50 is exact.
-constexpr int kPanels = 8;
-
-class CConcreteBending : public ISectionBending {
-public:
-    CConcreteBending(const T_SECT_D& section, const T_MATL_D& material, const T_CONCRETE_LAW& law,
-                     bool aboutY, bool positive)
-        : m_law(law), m_fck(material.fck), m_fyk(material.fyk), m_Es(material.Es),
-          m_round(section.shape == SECT_SHAPE::Circle)
-    {
-        m_depth = aboutY || m_round ? section.size[0] : section.size[1];
-        m_width = aboutY ? section.size[1] : section.size[0];
-        for (const T_REBAR& b : section.bars)
-            m_bars.push_back({(positive ? 1.0 : -1.0) * (aboutY ? b.z : b.y), b.area});
-    }
-
-    T_AXIAL_MOMENT At(double u) const override
-    {
-        const double x = u <= 1.0 ? u * m_depth : m_depth; // compressed depth within the section
-        const double peak = Pivot() * x;
-        T_AXIAL_MOMENT r;
-        AddConcrete(u, 0.0, peak, r);
-        AddConcrete(u, peak, x, r);
-        for (const T_BAR& b : m_bars)
-            AddBar(u, b, r);
-        return r;
-    }
-
-private:
-    struct T_BAR {
-        double lever = 0.0, area = 0.0; // lever from the centroid towards the compressed edge
-    };
-
-    /// Depth of the peak strain / x where the edge crushes.
-    double Pivot() const { return 1.0 - m_law.peakStrain / m_law.crushStrain; }
-
-    /// Strain at depth t under the compressed edge, compression positive.
-    double Strain(double u, double t) const
-    {
-        if (u <= 1.0) return m_law.crushStrain * (1.0 - t / (u * m_depth));
-        const double q = 2.0 - u; // depth / neutral axis depth
-        return m_law.peakStrain * (1.0 - q * t / m_depth) / (1.0 - q * Pivot());
-    }
-
-    double ConcreteStress(double strain) const
-    {
-        if (!(strain > 0.0)) return 0.0;
-        if (strain >= m_law.peakStrain) return m_fck;
-        return m_fck * (1.0 - std::pow(1.0 - strain / m_law.peakStrain, m_law.n));
-    }
-
-    void Add(double force, double t, T_AXIAL_MOMENT& r) const
-    {
-        r.axial += force;
-        r.moment += force * (m_depth / 2.0 - t);
-    }
-
-    /// Concrete between the depths t0 and t1. A circle is integrated over the angle from the edge
-    /// (t = R (1 - cos)), where the chord has no steep end. The points gather at t0 (as the square
-    /// of w): there begins the fall from the peak, whose broken power n no polynomial follows.
-    void AddConcrete(double u, double t0, double t1, T_AXIAL_MOMENT& r) const
-    {
-        const double radius = m_depth / 2.0;
-        const double from = m_round ? std::acos(1.0 - t0 / radius) : t0;
-        const double to = m_round ? std::acos(std::max(-1.0, 1.0 - t1 / radius)) : t1;
-        for (int i = 0; i < kPanels; ++i)
-            for (const auto& [point, weight] : kGauss) {
-                const double w = (2.0 * i + 1.0 + point) / (2.0 * kPanels);
-                const double s = from + (to - from) * w * w;
-                const double ds = (to - from) * w / kPanels; // 2 w dw, half a panel
-                const double chord = 2.0 * radius * std::sin(s);
-                const double t = m_round ? radius * (1.0 - std::cos(s)) : s;
-                const double area = m_round ? chord * radius * std::sin(s) : m_width;
-                Add(weight * ds * area * ConcreteStress(Strain(u, t)), t, r);
-            }
-    }
-
-    void AddBar(double u, const T_BAR& b, T_AXIAL_MOMENT& r) const
-    {
-        const double t = m_depth / 2.0 - b.lever;
-        const double strain = Strain(u, t);
-        const double stress = std::clamp(m_Es * strain, -m_fyk, m_fyk);
-        Add(b.area * (stress - ConcreteStress(strain)), t, r);
-    }
-
-    T_CONCRETE_LAW m_law;
-    double m_fck, m_fyk, m_Es;
-    bool m_round;
-    double m_depth = 0.0, m_width = 0.0;
-    std::vector<T_BAR> m_bars;
-};
+T_SECTION_MODEL SteelModel(const T_SECT_D& section, double fy)
+{
+    T_SECTION_MODEL model;
+    model.laws = {SteelLaw(fy, 0.0)};
+    model.regions = {{Rings(section), 0}};
+    model.plastic = true;
+    return model;
+}
 
 } // namespace
 
-std::unique_ptr<ISectionBending> MakeSteelBending(const T_SECT_D& section, double fy, bool aboutY)
+std::optional<CSectionBending>
+CSectionBending::Of(const T_SECT_D& section, const T_MATL_D& material, const T_CONCRETE_LAW& law)
 {
-    std::vector<T_SECT_PIECE> pieces = CSectionProperties::Pieces(section, aboutY);
-    if (!pieces.empty()) return std::make_unique<CSteelBending>(std::move(pieces), fy);
-    return std::make_unique<CLinearBending>(section.area * fy,
-                                            (aboutY ? section.Zy : section.Zz) * fy);
+    CSectionBending out;
+    out.m_plastic = material.type == MATL_CLASS::Steel;
+    out.m_straight = section.shape == SECT_SHAPE::Value;
+    out.m_axial = section.area * material.Fy;
+    out.m_moments = {section.Zy * material.Fy, section.Zz * material.Fy};
+    out.Turn(true, true);
+    T_SECTION_ERROR error;
+    if (out.m_straight) return out;
+    if (!out.m_solver.Prepare(out.m_plastic ? SteelModel(section, material.Fy)
+                                            : ConcreteModel(section, material, law),
+                              error))
+        return std::nullopt;
+    return out;
 }
 
-std::unique_ptr<ISectionBending> MakeConcreteBending(const T_SECT_D& section,
-                                                     const T_MATL_D& material,
-                                                     const T_CONCRETE_LAW& law, bool aboutY,
-                                                     bool positive)
+void CSectionBending::Turn(bool aboutY, bool positive)
 {
-    return std::make_unique<CConcreteBending>(section, material, law, aboutY, positive);
+    m_direction = (aboutY ? 0.0 : 0.5 * std::numbers::pi) + (positive ? 0.0 : std::numbers::pi);
+    m_moment = m_moments[aboutY ? 0 : 1];
+}
+
+T_AXIAL_MOMENT CSectionBending::Along(const T_CAPACITY& c) const
+{
+    return {c.axial, c.My * std::cos(m_direction) + c.Mz * std::sin(m_direction)};
+}
+
+int CSectionBending::At(double u, T_AXIAL_MOMENT& out) const
+{
+    if (m_straight) {
+        out = {(u - 1.0) * m_axial, (1.0 - std::fabs(u - 1.0)) * m_moment};
+        return 1;
+    }
+    T_CAPACITY found;
+    T_SECTION_ERROR error;
+    // Places of a plastic section end where the neutral axis leaves it.
+    if (!m_solver.Capacity(m_direction, m_plastic ? 0.5 * u : u, found, error)) return 0;
+    out = Along(found);
+    return 1;
+}
+
+int CSectionBending::AtAxial(double axial, T_AXIAL_MOMENT& out) const
+{
+    if (m_straight) return At(1.0 + axial / m_axial, out);
+    T_CAPACITY found;
+    T_SECTION_ERROR error;
+    if (!m_solver.AtAxial(m_direction, axial, found, error)) return 0;
+    out = Along(found);
+    return 1;
+}
+
+int CSectionBending::Largest(T_AXIAL_MOMENT& out, double& u) const
+{
+    if (m_straight) {
+        u = 1.0;
+        return At(u, out);
+    }
+    T_CAPACITY found;
+    T_SECTION_ERROR error;
+    double place = 0.0;
+    if (!m_solver.Largest(m_direction, found, place, error)) return 0;
+    out = Along(found);
+    u = m_plastic ? 2.0 * place : place;
+    return 1;
 }

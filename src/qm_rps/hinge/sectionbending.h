@@ -1,33 +1,43 @@
-// Uniaxial bending with axial force of one section about one axis in one direction.
+// Uniaxial bending with axial force of a section, and the law of its concrete.
 #pragma once
 
 #include "qm_db/records.h"
 #include "qm_db/sectionproperties.h"
 #include "qm_rps/codes/concretelaw.h"
+#include "qm_solver/sectionsolver.h"
 
-#include <memory>
-#include <vector>
+#include <array>
+#include <optional>
 
 /// Axial force (compression positive) and moment about the centroid.
 struct T_AXIAL_MOMENT {
     double axial = 0.0, moment = 0.0;
 };
 
-/// The capacities over a parameter u that runs from 0 (pure tension) to 2 (pure compression); the
-/// axial force rises with u.
-class ISectionBending {
+/// Bending of a section about one axis in one direction. A place u runs from 0 (pure tension) to 2
+/// (pure compression); the axial force rises with it.
+class CSectionBending {
 public:
-    ISectionBending() = default;
-    ISectionBending(const ISectionBending&) = delete;
-    ISectionBending& operator=(const ISectionBending&) = delete;
-    virtual ~ISectionBending() = default;
-    virtual T_AXIAL_MOMENT At(double u) const = 0;
-};
+    /// The section must be sound and carry its properties; the methods stand at CSectionStrength.
+    /// Empty where a strain or a number is beyond what a section can have.
+    static std::optional<CSectionBending> Of(const T_SECT_D& section, const T_MATL_D& material,
+                                             const T_CONCRETE_LAW& law);
+    /// Compresses the side +z (about y) or +y (about z), the other side when not positive.
+    void Turn(bool aboutY, bool positive);
 
-/// Bending that compresses the side +z (about y) or +y (about z), the other side when not positive.
-/// The section must be sound and carry its properties; the methods stand at CSectionStrength.
-std::unique_ptr<ISectionBending> MakeSteelBending(const T_SECT_D& section, double fy, bool aboutY);
-std::unique_ptr<ISectionBending> MakeConcreteBending(const T_SECT_D& section,
-                                                     const T_MATL_D& material,
-                                                     const T_CONCRETE_LAW& law, bool aboutY,
-                                                     bool positive);
+    /// 1 done; 0 nothing found, the outputs unchanged.
+    [[nodiscard]] int At(double u, T_AXIAL_MOMENT& out) const;
+    [[nodiscard]] int AtAxial(double axial, T_AXIAL_MOMENT& out) const;
+    [[nodiscard]] int Largest(T_AXIAL_MOMENT& out, double& u) const;
+
+private:
+    T_AXIAL_MOMENT Along(const solver::T_CAPACITY& capacity) const;
+
+    solver::CSectionSolver m_solver;
+    bool m_plastic = false;
+    double m_direction = 0.0;
+    /// Straight interaction of a section without a shape: axial strength, moments about y and z.
+    bool m_straight = false;
+    double m_axial = 0.0, m_moment = 0.0;
+    std::array<double, 2> m_moments{};
+};

@@ -9,9 +9,7 @@
 
 namespace {
 
-constexpr int kMaxIterations = 200;
-constexpr double kAxialTol = 1e-9; // residual of the axial force / range of axial forces
-constexpr int kScan = 64;          // steps of the search for the largest moment
+constexpr int kCurveSteps = 64;
 /// Way of the points A to E from the largest moment to pure compression and to pure tension.
 constexpr std::array<double, 5> kWayC{0.0, 0.25, 0.5, 0.75, 1.0};
 constexpr std::array<double, 5> kWayT{0.05, 0.25, 0.5, 0.75, 1.0};
@@ -26,67 +24,31 @@ double FckMpa(const T_MATL_D& m, const T_UNITS& units)
     return ToSi(m.fck, units, kDimStress) / 1e6;
 }
 
-/// u of an axial force between the forces at lo and hi, by bisection.
-bool FindAxial(const ISectionBending& bending, double axial, double lo, double hi, double& u)
-{
-    const double nLo = bending.At(lo).axial, nHi = bending.At(hi).axial;
-    const double tol = kAxialTol * (bending.At(2.0).axial - bending.At(0.0).axial);
-    if (!(nLo - tol <= axial && axial <= nHi + tol)) return false;
-    for (int i = 0; i < kMaxIterations && hi - lo > 0.0; ++i) {
-        const double mid = 0.5 * (lo + hi);
-        if (mid <= lo || mid >= hi) break;
-        (bending.At(mid).axial < axial ? lo : hi) = mid;
-    }
-    u = std::fabs(bending.At(lo).axial - axial) < std::fabs(bending.At(hi).axial - axial) ? lo : hi;
-    return std::fabs(bending.At(u).axial - axial) <= tol;
-}
-
-/// u of the largest moment: scan, then golden section around the best step.
-double FindPeak(const ISectionBending& bending)
-{
-    double best = 0.0;
-    for (int i = 0; i <= kScan; ++i) {
-        const double u = 2.0 * i / kScan;
-        if (bending.At(u).moment > bending.At(best).moment) best = u;
-    }
-    constexpr double kGolden = 1.0 / std::numbers::phi;
-    double lo = std::max(0.0, best - 2.0 / kScan), hi = std::min(2.0, best + 2.0 / kScan);
-    for (int i = 0; i < kMaxIterations && hi - lo > 1e-12; ++i) {
-        const double a = hi - kGolden * (hi - lo), b = lo + kGolden * (hi - lo);
-        (bending.At(a).moment < bending.At(b).moment ? lo : hi) =
-            bending.At(a).moment < bending.At(b).moment ? a : b;
-    }
-    const double refined = 0.5 * (lo + hi);
-    return bending.At(refined).moment > bending.At(best).moment ? refined : best;
-}
-
 struct T_DIRECTION {
     double atZero = 0.0, largest = 0.0; // moments
     T_PM_CURVE curve{};
 };
 
 /// Moments and the ten points of one direction.
-bool Solve(const ISectionBending& bending, T_DIRECTION& out)
+bool Solve(const CSectionBending& bending, T_DIRECTION& out)
 {
-    double u = 0.0;
-    if (!FindAxial(bending, 0.0, 0.0, 2.0, u)) return false;
-    out.atZero = bending.At(u).moment;
-    const double peak = FindPeak(bending);
-    const T_AXIAL_MOMENT top = bending.At(peak);
+    T_AXIAL_MOMENT zero, top, pure, tension;
+    double peak = 0.0;
+    if (!bending.AtAxial(0.0, zero) || !bending.Largest(top, peak)) return false;
+    if (!bending.At(2.0, pure) || !bending.At(0.0, tension)) return false;
+    out.atZero = zero.moment;
     out.largest = top.moment;
-    const double pure = bending.At(2.0).axial, tension = bending.At(0.0).axial;
     if (!Positive(out.atZero) || !Positive(out.largest)) return false;
-    if (!(tension < top.axial && top.axial < pure)) return false;
+    if (!(tension.axial < top.axial && top.axial < pure.axial)) return false;
     for (std::size_t i = 0; i < kWayC.size(); ++i) {
-        const double c = top.axial + kWayC[i] * (pure - top.axial);
-        const double t = top.axial + kWayT[i] * (tension - top.axial);
-        double uc = 2.0, ut = 0.0;
-        if (i + 1 < kWayC.size() &&
-            (!FindAxial(bending, c, peak, 2.0, uc) || !FindAxial(bending, t, 0.0, peak, ut)))
+        const double c = top.axial + kWayC[i] * (pure.axial - top.axial);
+        const double t = top.axial + kWayT[i] * (tension.axial - top.axial);
+        T_AXIAL_MOMENT atC = pure, atT = tension;
+        if (i + 1 < kWayC.size() && (!bending.AtAxial(c, atC) || !bending.AtAxial(t, atT)))
             return false;
-        const double ratio = bending.At(uc).moment / out.largest;
-        out.curve[4 - i] = {c / pure, i == 0 ? CSectionStrength::kLargestRatio : ratio};
-        out.curve[5 + i] = {t / pure, bending.At(ut).moment / out.largest};
+        const double ratio = i == 0 ? CSectionStrength::kLargestRatio : atC.moment / out.largest;
+        out.curve[4 - i] = {c / pure.axial, ratio};
+        out.curve[5 + i] = {t / pure.axial, atT.moment / out.largest};
     }
     return true;
 }
@@ -136,30 +98,25 @@ bool Prepare(const T_SECT_D& in, const T_MATL_D& m, const T_UNITS& units, T_SECT
     return fault == SECT_FAULT::None;
 }
 
-/// A section that its strengths can be calculated of, and how it bends.
-struct T_READY {
-    const T_SECT_D& section;
-    const T_MATL_D& material;
-    T_CONCRETE_LAW law{}; // of concrete
-    T_READY(const T_SECT_D& s, const T_MATL_D& m, const T_UNITS& units) : section(s), material(m)
-    {
-        if (m.type == MATL_CLASS::Concrete)
-            law = ConcreteLaw(std::min(FckMpa(m, units), kMaxFckMpa));
-    }
-    std::unique_ptr<ISectionBending> Bending(bool aboutY, bool positive) const
-    {
-        // A steel section is symmetric: (+) and (-) are the same.
-        return material.type == MATL_CLASS::Steel
-                   ? MakeSteelBending(section, material.Fy, aboutY)
-                   : MakeConcreteBending(section, material, law, aboutY, positive);
-    }
-};
+/// How a section bends that its strengths can be calculated of.
+bool PrepareBending(const T_SECT_D& in, const T_MATL_D& m, const T_UNITS& units, T_SECT_D& section,
+                    std::optional<CSectionBending>& bending, SECT_FAULT& fault)
+{
+    if (!Prepare(in, m, units, section, fault)) return false;
+    T_CONCRETE_LAW law;
+    if (m.type == MATL_CLASS::Concrete) law = ConcreteLaw(std::min(FckMpa(m, units), kMaxFckMpa));
+    bending = CSectionBending::Of(section, m, law);
+    if (!bending) fault = SECT_FAULT::Material;
+    return bending.has_value();
+}
 
-bool SolveAxis(const T_READY& ready, bool aboutY, T_YIELD_AXIS& axis)
+bool SolveAxis(CSectionBending& bending, bool aboutY, T_YIELD_AXIS& axis)
 {
     T_DIRECTION pos, neg;
-    if (!Solve(*ready.Bending(aboutY, true), pos)) return false;
-    if (!Solve(*ready.Bending(aboutY, false), neg)) return false;
+    bending.Turn(aboutY, true);
+    if (!Solve(bending, pos)) return false;
+    bending.Turn(aboutY, false);
+    if (!Solve(bending, neg)) return false;
     axis = {true, {pos.atZero, neg.atZero}, {pos.largest, neg.largest}, {pos.curve, neg.curve}};
     return true;
 }
@@ -175,16 +132,17 @@ int CSectionStrength::Calc(const T_SECT_D& section, const T_MATL_D& material, co
                            T_SECTION_STRENGTH& out, SECT_FAULT& fault)
 {
     T_SECT_D s;
-    if (!Prepare(section, material, units, s, fault)) return 0;
+    std::optional<CSectionBending> bending;
+    if (!PrepareBending(section, material, units, s, bending, fault)) return 0;
     T_SECTION_STRENGTH r;
-    const T_READY ready(s, material, units);
-    const auto axial = ready.Bending(true, true);
-    r.level.compression = axial->At(2.0).axial;
-    r.level.tension = -axial->At(0.0).axial;
-    if (!SolveAxis(ready, true, r.level.y) || !SolveAxis(ready, false, r.level.z)) {
+    T_AXIAL_MOMENT pure, tension;
+    if (!bending->At(2.0, pure) || !bending->At(0.0, tension) ||
+        !SolveAxis(*bending, true, r.level.y) || !SolveAxis(*bending, false, r.level.z)) {
         fault = SECT_FAULT::NotConverged;
         return 0;
     }
+    r.level.compression = pure.axial;
+    r.level.tension = -tension.axial;
     const auto at = [&r](HINGE_COMPONENT c) -> auto&
     {
         return r.yield[static_cast<std::size_t>(c)];
@@ -207,18 +165,19 @@ int CSectionStrength::CalcMoment(const T_SECT_D& section, const T_MATL_D& materi
                                  double& moment, SECT_FAULT& fault)
 {
     T_SECT_D s;
-    if (!Prepare(section, material, units, s, fault)) return 0;
-    const auto bending = T_READY(s, material, units).Bending(aboutY, positive);
-    if (!(bending->At(0.0).axial <= axial && axial <= bending->At(2.0).axial)) {
+    std::optional<CSectionBending> bending;
+    if (!PrepareBending(section, material, units, s, bending, fault)) return 0;
+    bending->Turn(aboutY, positive);
+    T_AXIAL_MOMENT pure, tension, found;
+    fault = SECT_FAULT::NotConverged;
+    if (!bending->At(2.0, pure) || !bending->At(0.0, tension)) return 0;
+    if (!(tension.axial <= axial && axial <= pure.axial)) {
         fault = SECT_FAULT::Values;
         return 0;
     }
-    double u = 0.0;
-    if (!FindAxial(*bending, axial, 0.0, 2.0, u)) {
-        fault = SECT_FAULT::NotConverged;
-        return 0;
-    }
-    moment = bending->At(u).moment;
+    if (!bending->AtAxial(axial, found)) return 0;
+    fault = SECT_FAULT::None;
+    moment = found.moment;
     return 1;
 }
 
@@ -227,23 +186,25 @@ int CSectionStrength::CalcCurve(const T_SECT_D& section, const T_MATL_D& materia
                                 std::vector<T_PM_POINT>& out, SECT_FAULT& fault)
 {
     T_SECT_D s;
-    if (!Prepare(section, material, units, s, fault)) return 0;
-    const auto bending = T_READY(s, material, units).Bending(aboutY, positive);
-    const double pure = bending->At(2.0).axial, peak = FindPeak(*bending);
-    const double largest = bending->At(peak).moment;
-    if (!Positive(pure) || !Positive(largest)) {
-        fault = SECT_FAULT::NotConverged;
-        return 0;
-    }
+    std::optional<CSectionBending> bending;
+    if (!PrepareBending(section, material, units, s, bending, fault)) return 0;
+    bending->Turn(aboutY, positive);
+    T_AXIAL_MOMENT pure, top;
+    double peak = 0.0;
+    fault = SECT_FAULT::NotConverged;
+    if (!bending->At(2.0, pure) || !bending->Largest(top, peak)) return 0;
+    if (!Positive(pure.axial) || !Positive(top.moment)) return 0;
     std::vector<double> places{peak};
-    for (int i = 0; i <= kScan; ++i)
-        places.push_back(2.0 * i / kScan);
+    for (int i = 0; i <= kCurveSteps; ++i)
+        places.push_back(2.0 * i / kCurveSteps);
     std::ranges::sort(places, std::greater());
     std::vector<T_PM_POINT> curve;
     for (const double u : places) {
-        const T_AXIAL_MOMENT at = bending->At(u);
-        curve.push_back({at.axial / pure, at.moment / largest});
+        T_AXIAL_MOMENT at;
+        if (!bending->At(u, at)) return 0;
+        curve.push_back({at.axial / pure.axial, at.moment / top.moment});
     }
+    fault = SECT_FAULT::None;
     out = std::move(curve);
     return 1;
 }

@@ -13,6 +13,14 @@ namespace {
 constexpr double kEndless = std::numeric_limits<double>::infinity();
 using std::numbers::pi;
 
+/// Cosine or sine; of a quarter turn without the rounding of pi, so that both sides of a symmetric
+/// section give the same.
+double Exact(double v)
+{
+    constexpr double kRounding = 1e-15;
+    return std::fabs(v) < kRounding ? 0.0 : v;
+}
+
 } // namespace
 
 CSectionView::CSectionView(const T_SECTION_SHAPE& shape, double direction)
@@ -27,8 +35,8 @@ CSectionView::CSectionView(const T_SECTION_SHAPE& shape, double direction)
 void CSectionView::Turn(double direction)
 {
     m_direction = direction;
-    m_cos = std::cos(direction);
-    m_sin = std::sin(direction);
+    m_cos = Exact(std::cos(direction));
+    m_sin = Exact(std::sin(direction));
     m_lines.clear(), m_bows.clear(), m_points.clear();
     m_ranges.assign(m_shape.model.regions.size(), {kEndless, -kEndless});
     for (const T_EDGE& e : m_shape.edges)

@@ -14,6 +14,7 @@ constexpr std::size_t kSamples = 65;
 constexpr double kAxialTol = 1e-12;  // of an axial force, over the range of them
 constexpr double kPlaceTol = 1e-11;  // of the largest moment, whose curve is flat there
 constexpr double kAllTension = -1e3; // a strain that all steel yields at
+constexpr double kRounding = 1e-13;  // of a moment
 constexpr int kMaxIterations = 200;
 constexpr double kEndless = std::numeric_limits<double>::infinity();
 
@@ -176,7 +177,9 @@ double CUltimateStates::Peak()
         }
     }
     const double refined = 0.5 * (lo + hi);
-    return Moment(At(refined)) > Moment(*best) ? refined : PlaceOf(at);
+    // A sample that is the largest but for rounding stays: a symmetric section has it there.
+    const double least = Moment(*best) + kRounding * std::fabs(Moment(*best));
+    return Moment(At(refined)) > least ? refined : PlaceOf(at);
 }
 
 T_CAPACITY CUltimateStates::Between(double axial, double a, const T_CAPACITY& atA, double b,
