@@ -85,7 +85,7 @@ struct T_MOMENT_CURVATURE {
     T_FIBRE governs; // at its limit where the end is StrainLimit
     /// Straight from the first point through yield to the corner, then level up to the ultimate
     /// curvature; beyond yield it has the area of the curve of `points`. False where nothing lies
-    /// beyond yield, or no such line has that area.
+    /// beyond yield, or the level would lie above the largest moment.
     bool idealised = false;
     double idealCurvature = 0.0, idealMoment = 0.0; // the corner
 };

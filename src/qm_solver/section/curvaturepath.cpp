@@ -13,6 +13,8 @@ namespace {
 constexpr double kTol = 1e-11; // of the balance, over the scale of the forces
 constexpr int kNewtonSteps = 40;
 constexpr int kHalvings = 12;
+constexpr int kReachHalvings = 5;
+constexpr double kAcross = 1e-3; // first step across, over the curvature along
 constexpr int kMarchSteps = 2000;
 constexpr int kUniformSteps = 64;
 constexpr double kFirstStep = 0.05;   // of the least curvature that yields
@@ -50,21 +52,21 @@ CCurvaturePath::T_BALANCE CCurvaturePath::Balance(const T_UNKNOWN& at)
     return out;
 }
 
-double CCurvaturePath::Miss(const T_BALANCE& b) const
+double CCurvaturePath::Miss(const T_BALANCE& b, bool turning) const
 {
-    const double across = m_request.ofMoment ? std::fabs(b.across) / m_depth : 0.0;
+    const double across = turning ? std::fabs(b.across) / m_depth : 0.0;
     return (std::fabs(b.force - m_request.axial) + across) / m_force;
 }
 
-/// Of axial strain and, where the direction is that of the moment, the curvature across it.
-std::optional<CCurvaturePath::T_STATE> CCurvaturePath::Newton(T_UNKNOWN at)
+/// Of axial strain and, where the axis turns, the curvature across.
+std::optional<CCurvaturePath::T_STATE> CCurvaturePath::Newton(T_UNKNOWN at, bool turning)
 {
     T_BALANCE b = Balance(at);
-    for (int i = 0; i < kNewtonSteps && Miss(b) > kTol; ++i) {
+    for (int i = 0; i < kNewtonSteps && Miss(b, turning) > kTol; ++i) {
         const double r = m_request.axial - b.force, q = -b.across;
         const double det = b.byAxial * b.byAcross - b.mixed * b.mixed;
         double axial = r / b.byAxial, across = 0.0;
-        if (m_request.ofMoment) {
+        if (turning) {
             axial = (r * b.byAcross - q * b.mixed) / det;
             across = (q * b.byAxial - r * b.mixed) / det;
         }
@@ -75,19 +77,18 @@ std::optional<CCurvaturePath::T_STATE> CCurvaturePath::Newton(T_UNKNOWN at)
         for (int k = 0; k < kHalvings; ++k, part *= 0.5) {
             next = {at.axial + part * axial, at.along, at.across + part * across};
             nextBalance = Balance(next);
-            if (Miss(nextBalance) < Miss(b)) break;
+            if (Miss(nextBalance, turning) < Miss(b, turning)) break;
         }
-        if (!(Miss(nextBalance) < Miss(b))) return std::nullopt;
+        if (!(Miss(nextBalance, turning) < Miss(b, turning))) return std::nullopt;
         at = next, b = nextBalance;
     }
-    if (!(Miss(b) <= kTol)) return std::nullopt;
+    if (!(Miss(b, turning) <= kTol)) return std::nullopt;
     return StateOf(at);
 }
 
 /// The axial strain nearest to the guess, for a fixed neutral axis.
 std::optional<CCurvaturePath::T_STATE> CCurvaturePath::Bracketed(T_UNKNOWN at)
 {
-    if (m_request.ofMoment) return std::nullopt;
     const double guess = at.axial;
     const auto miss = [&](double axial) {
         at.axial = axial;
@@ -112,12 +113,55 @@ std::optional<CCurvaturePath::T_STATE> CCurvaturePath::Bracketed(T_UNKNOWN at)
     return StateOf(at);
 }
 
+std::optional<CCurvaturePath::T_STATE> CCurvaturePath::AtAxis(const T_UNKNOWN& guess)
+{
+    const auto found = Newton(guess, false);
+    return found ? found : Bracketed(guess);
+}
+
+/// The curvature across nearest to the guess by its bracket: where concrete spalls, the tangent
+/// does not know how fast it goes.
+std::optional<CCurvaturePath::T_STATE> CCurvaturePath::Turned(T_UNKNOWN at)
+{
+    const double guess = at.across, c = std::cos(m_request.direction),
+                 s = std::sin(m_request.direction);
+    const auto miss = [&](double across) {
+        at.across = across;
+        const auto state = AtAxis(at);
+        if (!state) return std::numeric_limits<double>::quiet_NaN();
+        at.axial = state->at.axial;
+        return (c * state->point.Mz - s * state->point.My) / m_depth;
+    };
+    double low = guess, high = guess, fLow = miss(guess), fHigh = fLow;
+    // The moment across rises with the curvature across.
+    for (double step = kAcross * at.along; step < at.along; step *= 2.0) {
+        if (fLow > 0.0) high = low, fHigh = fLow, low = guess - step, fLow = miss(low);
+        if (fHigh <= 0.0) low = high, fLow = fHigh, high = guess + step, fHigh = miss(high);
+    }
+    if (!(fLow <= 0.0) || !(fHigh > 0.0)) return std::nullopt;
+    const T_BRACKET root = BracketRoot(miss, low, fLow, high, fHigh, kTol * m_force);
+    if (!(std::fabs(root.f) <= kTol * m_force)) return std::nullopt;
+    at.across = root.x;
+    return AtAxis(at);
+}
+
 std::optional<CCurvaturePath::T_STATE> CCurvaturePath::Solve(const T_STATE& from, double curvature)
 {
     T_UNKNOWN guess = from.at;
     guess.along = curvature;
-    auto found = Newton(guess);
-    return found ? found : Bracketed(guess);
+    if (!m_request.ofMoment) return AtAxis(guess);
+    const auto found = Newton(guess, true);
+    return found ? found : Turned(guess);
+}
+
+/// In smaller steps where one does not get there.
+std::optional<CCurvaturePath::T_STATE> CCurvaturePath::Reach(const T_STATE& from, double curvature,
+                                                             int halvings)
+{
+    const auto found = Solve(from, curvature);
+    if (found || halvings == 0) return found;
+    const auto mid = Reach(from, 0.5 * (from.at.along + curvature), halvings - 1);
+    return mid ? Reach(*mid, curvature, halvings - 1) : std::nullopt;
 }
 
 CCurvaturePath::T_REACHED CCurvaturePath::Reached(const std::vector<T_MARK>& marks, double e0,
@@ -198,8 +242,11 @@ bool CCurvaturePath::Start(T_STATE& first, T_SECTION_ERROR& error)
     error.fault = SECTION_FAULT::NotConverged;
     // Without curvature the direction of the moment can only be had by bending across.
     if (!m_request.ofMoment) return true;
-    const auto turned = Newton(first.at);
-    if (turned) first = *turned;
+    const auto turned = Newton(first.at, true);
+    if (turned)
+        first = *turned;
+    else
+        error.fault = SECTION_FAULT::NoSuchMoment;
     return turned.has_value();
 }
 
@@ -211,12 +258,12 @@ std::optional<CCurvaturePath::T_STATE> CCurvaturePath::Locate(const T_STATE& bef
 {
     std::optional<T_STATE> found = after;
     const auto at = [&](double curvature) {
-        found = Solve(before, curvature);
+        found = Reach(before, curvature, kReachHalvings);
         return found ? value(*found) : std::numeric_limits<double>::quiet_NaN();
     };
     const T_BRACKET root =
         BracketRoot(at, before.at.along, value(before), after.at.along, value(after), kTol);
-    return Solve(before, root.x);
+    return Reach(before, root.x, kReachHalvings);
 }
 
 /// The largest moment near the best state of the path, by golden section.
@@ -229,7 +276,7 @@ double CCurvaturePath::LargestMoment()
     double largest = best->point.moment;
     constexpr double kGolden = 1.0 / std::numbers::phi;
     const auto at = [&](double curvature) {
-        const auto state = Solve(from, curvature);
+        const auto state = Reach(from, curvature, kReachHalvings);
         const double moment = state ? state->point.moment : best->point.moment;
         largest = std::max(largest, moment);
         return moment;
@@ -318,7 +365,7 @@ bool CCurvaturePath::Fill(T_MOMENT_CURVATURE& out)
             const double curvature = from + (to - from) * double(i) / double(count);
             while (next + 1 < m_path.size() && m_path[next + 1].at.along <= curvature)
                 ++next;
-            const auto state = Solve(m_path[next], curvature);
+            const auto state = Reach(m_path[next], curvature, kReachHalvings);
             if (!state) return false;
             out.points.push_back(state->point);
         }
@@ -359,8 +406,10 @@ void Idealise(T_MOMENT_CURVATURE& out)
     if (!(rest >= 0.0)) return;
     // A curve that falls behind yield has a lower level, which is left before yield.
     const double above = area > 0.0 ? slope * (way - std::sqrt(rest)) : area / way;
+    const double level = yield.moment + above;
+    if (level > std::ranges::max(out.points, {}, &T_CURVATURE_POINT::moment).moment) return;
     out.idealised = true;
-    out.idealMoment = yield.moment + above;
+    out.idealMoment = level;
     out.idealCurvature = yield.curvature + above / slope;
 }
 

@@ -42,10 +42,13 @@ private:
     bool Start(T_STATE& first, T_SECTION_ERROR& error);
     std::vector<double> UniformStrains() const;
     T_BALANCE Balance(const T_UNKNOWN& at);
-    double Miss(const T_BALANCE& balance) const;
-    std::optional<T_STATE> Newton(T_UNKNOWN guess);
+    double Miss(const T_BALANCE& balance, bool turning) const;
+    std::optional<T_STATE> Newton(T_UNKNOWN guess, bool turning);
     std::optional<T_STATE> Bracketed(T_UNKNOWN guess);
+    std::optional<T_STATE> AtAxis(const T_UNKNOWN& guess);
+    std::optional<T_STATE> Turned(T_UNKNOWN guess);
     std::optional<T_STATE> Solve(const T_STATE& from, double curvature);
+    std::optional<T_STATE> Reach(const T_STATE& from, double curvature, int halvings);
     T_STATE StateOf(const T_UNKNOWN& at);
     T_REACHED Reached(const std::vector<T_MARK>& marks, double e0, double kappa) const;
     bool March(T_MOMENT_CURVATURE& out);

@@ -151,20 +151,30 @@ void CSectionView::MarkBars()
 
 namespace {
 
-/// Adds a place of the outline; ds is its part of the way, with the weight and the sign.
-template <bool kTangent>
-void AddPlace(const CStressLaw& law, const T_LAW_PIECE& piece, double strain, double s, double t,
-              double ds, T_SUMS& sums)
+/// What a place of the outline adds to the sums over the section of 1, t and t2.
+struct T_PLACE {
+    double s = 0.0, area = 0.0, overT = 0.0, overTT = 0.0;
+};
+
+/// ds is the part of the way, with the weight and the sign.
+T_PLACE PlaceAt(double s, double t, double ds)
 {
-    const double area = -ds * t, overT = 0.5 * area * t;
+    const double area = -ds * t;
+    return {s, area, area * t / 2.0, area * t * t / 3.0};
+}
+
+template <bool kTangent>
+void AddPlace(const CStressLaw& law, const T_LAW_PIECE& piece, double strain, const T_PLACE& at,
+              T_SUMS& sums)
+{
     const double stress = law.Stress(piece, strain);
-    sums.force += stress * area;
-    sums.overS += stress * area * s;
-    sums.overT += stress * overT;
+    sums.force += stress * at.area;
+    sums.overS += stress * at.area * at.s;
+    sums.overT += stress * at.overT;
     if constexpr (kTangent) {
         const double slope = law.Tangent(piece, strain);
-        const std::array<double, 6> parts{area,         area * s,  overT,
-                                          area * s * s, overT * s, overT * t * (2.0 / 3.0)};
+        const std::array<double, 6> parts{
+            at.area, at.area * at.s, at.overT, at.area * at.s * at.s, at.overT * at.s, at.overTT};
         for (std::size_t i = 0; i < parts.size(); ++i)
             sums.tangent[i] += slope * parts[i];
     }
@@ -201,8 +211,9 @@ void CSectionView::SumLine(const T_LINE& line, double e0, double kappa, T_SUMS& 
             a = std::min(p, q), b = std::max(p, q);
         }
         const auto add = [&](double at, double weight) {
-            AddPlace<kTangent>(law, piece, ea + at * (eb - ea), line.s0 + at * ds,
-                               line.t0 + at * dt, line.sign * weight * ds, sums);
+            AddPlace<kTangent>(
+                law, piece, ea + at * (eb - ea),
+                PlaceAt(line.s0 + at * ds, line.t0 + at * dt, line.sign * weight * ds), sums);
         };
         if (piece.shape == LAW_SHAPE::Polynomial) {
             for (const auto& [at, weight] : kGauss3)
@@ -225,8 +236,9 @@ void CSectionView::SumBow(const T_BOW& bow, double e0, double kappa, T_SUMS& sum
         if (e <= mid - reach) return pi;
         return e >= mid + reach ? 0.0 : std::acos((e - mid) / reach);
     };
-    // The half of the circle on the side of t (+1) or against it (-1), between two angles.
-    const auto half = [&](double from, double to, double side) {
+    // The circle between two angles, on the side of t (+1), against it (-1) or on both (0), which
+    // are symmetric about its centre.
+    const auto part = [&](double from, double to, double side) {
         for (const T_LAW_PIECE& piece : law.Pieces()) {
             if (piece.Zero() || piece.to <= mid - reach || piece.from > mid + reach) continue;
             const double a = std::max(from, angle(piece.to));
@@ -234,8 +246,12 @@ void CSectionView::SumBow(const T_BOW& bow, double e0, double kappa, T_SUMS& sum
             if (!(a < b)) continue;
             const auto add = [&](double at, double weight) {
                 const double across = bow.radius * std::sin(at), s = bow.radius * std::cos(at);
-                AddPlace<kTangent>(law, piece, mid + kappa * s, bow.s + s, bow.t + side * across,
-                                   -bow.sign * side * weight * across, sums);
+                const double ds = -bow.sign * weight * across, both = -2.0 * ds * across;
+                const T_PLACE place = side != 0.0
+                                          ? PlaceAt(bow.s + s, bow.t + side * across, side * ds)
+                                          : T_PLACE{bow.s + s, both, both * bow.t,
+                                                    both * (bow.t * bow.t + across * across / 3.0)};
+                AddPlace<kTangent>(law, piece, mid + kappa * s, place, sums);
             };
             if (piece.shape == LAW_SHAPE::Polynomial)
                 ForGauss16([&](double at, double w) { add(a + (b - a) * at, (b - a) * w); });
@@ -248,14 +264,15 @@ void CSectionView::SumBow(const T_BOW& bow, double e0, double kappa, T_SUMS& sum
             }
         }
     };
+    if (bow.sweep >= 2.0 * pi) return part(0.0, pi, 0.0);
     for (int k = 0; k < 4; ++k) {
         const double from = std::max(bow.from, k * pi),
                      to = std::min(bow.from + bow.sweep, (k + 1) * pi);
         if (!(from < to)) continue;
         if (k % 2 == 0)
-            half(from - k * pi, to - k * pi, 1.0);
+            part(from - k * pi, to - k * pi, 1.0);
         else
-            half((k + 1) * pi - to, (k + 1) * pi - from, -1.0);
+            part((k + 1) * pi - to, (k + 1) * pi - from, -1.0);
     }
 }
 

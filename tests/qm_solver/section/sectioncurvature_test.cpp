@@ -103,3 +103,24 @@ TEST(SectionCurvature, SpallingEndsByLossOfMoment)
                 std::fabs(r.points[r.yield].plane.axial - 80 * r.points[r.yield].plane.overZ),
                 1e-10);
 }
+
+// A fibre at its limit ends the path where the capacity for the same axial force and axis is:
+// pivots A, B and C in turn.
+TEST(SectionCurvature, AStrainLimitEndsOnTheInteractionCurve)
+{
+    const T_SECTION_MODEL m =
+        SectionOf(RectangleRing(300, 500), ConcreteOf(30), SteelOf(450, 2e5, 600, 0.02),
+                  {{100, 200, 300}, {-100, 200, 300}, {0, -200, 900}});
+    for (const double axial : {-2e5, 3e5, 1.5e6, 4.2e6})
+        for (const double direction : {0.0, 0.8, 3.0}) {
+            T_CURVATURE_REQUEST request{axial, direction};
+            const T_MOMENT_CURVATURE r = Curvature(m, request);
+            ASSERT_EQ(CURVATURE_END::StrainLimit, r.end) << axial;
+            T_CAPACITY c;
+            T_SECTION_ERROR error;
+            ASSERT_EQ(1, Prepared(m).AtAxial(direction, axial, c, error)) << axial;
+            EXPECT_EQ(c.governs, r.governs) << axial;
+            EXPECT_NEAR(c.My, r.points.back().My, 1e-7 * std::hypot(c.My, c.Mz)) << axial;
+            EXPECT_NEAR(c.Mz, r.points.back().Mz, 1e-7 * std::hypot(c.My, c.Mz)) << axial;
+        }
+}
