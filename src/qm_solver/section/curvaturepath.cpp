@@ -10,11 +10,7 @@ namespace solver {
 
 namespace {
 
-constexpr double kTol = 1e-11; // of the balance, over the scale of the forces
-constexpr int kNewtonSteps = 40;
-constexpr int kHalvings = 12;
-constexpr int kReachHalvings = 5;
-constexpr double kAcross = 1e-3; // first step across, over the curvature along
+constexpr double kTol = 1e-11; // of a root, over its scale
 constexpr int kMarchSteps = 2000;
 constexpr int kUniformSteps = 64;
 constexpr double kFirstStep = 0.05;   // of the least curvature that yields
@@ -26,167 +22,8 @@ constexpr double kStuck = 1e-7;       // a step over the curvature: nothing hold
 } // namespace
 
 CCurvaturePath::CCurvaturePath(const T_SECTION_SHAPE& shape, const T_CURVATURE_REQUEST& request)
-    : m_view(shape, request.direction), m_request(request)
+    : m_balance(shape, request), m_request(request)
 {
-    m_depth = m_view.Top() - m_view.Bottom();
-}
-
-// ---- balance ------------------------------------------------------------------------------------
-
-CCurvaturePath::T_BALANCE CCurvaturePath::Balance(const T_UNKNOWN& at)
-{
-    const double kappa = std::hypot(at.along, at.across);
-    const double turn = kappa > 0.0 ? std::atan2(at.across, at.along) : 0.0;
-    if (m_request.direction + turn != m_view.Direction()) m_view.Turn(m_request.direction + turn);
-    const T_SUMS sums = m_view.SumsAndTangent(at.axial, kappa);
-    // t runs against the direction a quarter turn on.
-    const double c = std::cos(turn), s = std::sin(turn);
-    const auto& [k, ks, kt, kss, kst, ktt] = sums.tangent;
-    T_BALANCE out;
-    out.force = sums.force;
-    out.along = c * sums.overS + s * sums.overT;
-    out.across = s * sums.overS - c * sums.overT;
-    out.byAxial = k;
-    out.mixed = s * ks - c * kt;
-    out.byAcross = s * s * kss - 2.0 * s * c * kst + c * c * ktt;
-    return out;
-}
-
-double CCurvaturePath::Miss(const T_BALANCE& b, bool turning) const
-{
-    const double across = turning ? std::fabs(b.across) / m_depth : 0.0;
-    return (std::fabs(b.force - m_request.axial) + across) / m_force;
-}
-
-/// Of axial strain and, where the axis turns, the curvature across.
-std::optional<CCurvaturePath::T_STATE> CCurvaturePath::Newton(T_UNKNOWN at, bool turning)
-{
-    T_BALANCE b = Balance(at);
-    for (int i = 0; i < kNewtonSteps && Miss(b, turning) > kTol; ++i) {
-        const double r = m_request.axial - b.force, q = -b.across;
-        const double det = b.byAxial * b.byAcross - b.mixed * b.mixed;
-        double axial = r / b.byAxial, across = 0.0;
-        if (turning) {
-            axial = (r * b.byAcross - q * b.mixed) / det;
-            across = (q * b.byAxial - r * b.mixed) / det;
-        }
-        if (!std::isfinite(axial) || !std::isfinite(across)) return std::nullopt;
-        double part = 1.0;
-        T_UNKNOWN next;
-        T_BALANCE nextBalance;
-        for (int k = 0; k < kHalvings; ++k, part *= 0.5) {
-            next = {at.axial + part * axial, at.along, at.across + part * across};
-            nextBalance = Balance(next);
-            if (Miss(nextBalance, turning) < Miss(b, turning)) break;
-        }
-        if (!(Miss(nextBalance, turning) < Miss(b, turning))) return std::nullopt;
-        at = next, b = nextBalance;
-    }
-    if (!(Miss(b, turning) <= kTol)) return std::nullopt;
-    return StateOf(at);
-}
-
-/// The axial strain nearest to the guess, for a fixed neutral axis.
-std::optional<CCurvaturePath::T_STATE> CCurvaturePath::Bracketed(T_UNKNOWN at)
-{
-    const double guess = at.axial;
-    const auto miss = [&](double axial) {
-        at.axial = axial;
-        return Balance(at).force - m_request.axial;
-    };
-    const double reach = 1e-3 * (std::fabs(guess) + at.along * m_depth);
-    const double mid = miss(guess);
-    double low = guess, high = guess, fLow = mid, fHigh = mid;
-    for (double step = reach; step < 1e4 * reach && (fLow > 0.0) == (fHigh > 0.0); step *= 1.3) {
-        const double down = miss(guess - step), up = miss(guess + step);
-        if ((up > 0.0) != (fHigh > 0.0))
-            low = high, fLow = fHigh, high = guess + step, fHigh = up;
-        else if ((down > 0.0) != (fLow > 0.0))
-            high = low, fHigh = fLow, low = guess - step, fLow = down;
-        else
-            low = guess - step, fLow = down, high = guess + step, fHigh = up;
-    }
-    if ((fLow > 0.0) == (fHigh > 0.0)) return std::nullopt;
-    const T_BRACKET root = BracketRoot(miss, low, fLow, high, fHigh, kTol * m_force);
-    if (!(std::fabs(root.f) <= kTol * m_force)) return std::nullopt;
-    at.axial = root.x;
-    return StateOf(at);
-}
-
-std::optional<CCurvaturePath::T_STATE> CCurvaturePath::AtAxis(const T_UNKNOWN& guess)
-{
-    const auto found = Newton(guess, false);
-    return found ? found : Bracketed(guess);
-}
-
-/// The curvature across nearest to the guess by its bracket: where concrete spalls, the tangent
-/// does not know how fast it goes.
-std::optional<CCurvaturePath::T_STATE> CCurvaturePath::Turned(T_UNKNOWN at)
-{
-    const double guess = at.across, c = std::cos(m_request.direction),
-                 s = std::sin(m_request.direction);
-    const auto miss = [&](double across) {
-        at.across = across;
-        const auto state = AtAxis(at);
-        if (!state) return std::numeric_limits<double>::quiet_NaN();
-        at.axial = state->at.axial;
-        return (c * state->point.Mz - s * state->point.My) / m_depth;
-    };
-    double low = guess, high = guess, fLow = miss(guess), fHigh = fLow;
-    // The moment across rises with the curvature across.
-    for (double step = kAcross * at.along; step < at.along; step *= 2.0) {
-        if (fLow > 0.0) high = low, fHigh = fLow, low = guess - step, fLow = miss(low);
-        if (fHigh <= 0.0) low = high, fLow = fHigh, high = guess + step, fHigh = miss(high);
-    }
-    if (!(fLow <= 0.0) || !(fHigh > 0.0)) return std::nullopt;
-    const T_BRACKET root = BracketRoot(miss, low, fLow, high, fHigh, kTol * m_force);
-    if (!(std::fabs(root.f) <= kTol * m_force)) return std::nullopt;
-    at.across = root.x;
-    return AtAxis(at);
-}
-
-std::optional<CCurvaturePath::T_STATE> CCurvaturePath::Solve(const T_STATE& from, double curvature)
-{
-    T_UNKNOWN guess = from.at;
-    guess.along = curvature;
-    if (!m_request.ofMoment) return AtAxis(guess);
-    const auto found = Newton(guess, true);
-    return found ? found : Turned(guess);
-}
-
-/// In smaller steps where one does not get there.
-std::optional<CCurvaturePath::T_STATE> CCurvaturePath::Reach(const T_STATE& from, double curvature,
-                                                             int halvings)
-{
-    const auto found = Solve(from, curvature);
-    if (found || halvings == 0) return found;
-    const auto mid = Reach(from, 0.5 * (from.at.along + curvature), halvings - 1);
-    return mid ? Reach(*mid, curvature, halvings - 1) : std::nullopt;
-}
-
-CCurvaturePath::T_REACHED CCurvaturePath::Reached(const std::vector<T_MARK>& marks, double e0,
-                                                  double kappa) const
-{
-    T_REACHED out;
-    for (const T_MARK& mark : marks) {
-        const double part = (e0 + kappa * mark.s) / mark.strain;
-        if (part > out.part) out = {part, mark.fibre};
-    }
-    return out;
-}
-
-CCurvaturePath::T_STATE CCurvaturePath::StateOf(const T_UNKNOWN& at)
-{
-    const T_BALANCE b = Balance(at);
-    const double kappa = std::hypot(at.along, at.across);
-    const double c = std::cos(m_request.direction), s = std::sin(m_request.direction);
-    T_STATE out;
-    out.at = at;
-    out.point = {at.along, b.along, c * b.along - s * b.across, s * b.along + c * b.across,
-                 m_view.Plane(at.axial, kappa)};
-    out.limit = Reached(m_view.Limits(), at.axial, kappa);
-    out.yield = Reached(m_view.Yields(), at.axial, kappa);
-    return out;
 }
 
 // ---- start --------------------------------------------------------------------------------------
@@ -196,12 +33,12 @@ std::vector<double> CCurvaturePath::UniformStrains() const
 {
     double low = 0.0, high = 0.0, lowEnd = -1.0, highEnd = 1.0;
     std::vector<double> out{0.0};
-    for (const T_MARK& mark : m_view.Yields()) {
+    for (const T_MARK& mark : m_balance.View().Yields()) {
         out.push_back(mark.strain);
         low = std::min(low, kBeyondYield * mark.strain);
         high = std::max(high, kBeyondYield * mark.strain);
     }
-    for (const T_MARK& mark : m_view.Limits())
+    for (const T_MARK& mark : m_balance.View().Limits())
         (mark.strain > 0.0 ? highEnd : lowEnd) =
             mark.strain > 0.0 ? std::min(highEnd, mark.strain) : std::max(lowEnd, mark.strain);
     low = std::max(low, lowEnd), high = std::min(high, highEnd);
@@ -212,14 +49,14 @@ std::vector<double> CCurvaturePath::UniformStrains() const
     return out;
 }
 
-bool CCurvaturePath::Start(T_STATE& first, T_SECTION_ERROR& error)
+bool CCurvaturePath::Start(T_BENT_STATE& first, T_SECTION_ERROR& error)
 {
     const std::vector<double> strains = UniformStrains();
     std::vector<double> forces;
     for (const double e : strains)
-        forces.push_back(Balance({e, 0.0, 0.0}).force);
+        forces.push_back(m_balance.UniformForce(e));
     const auto [least, most] = std::ranges::minmax(forces);
-    m_force = std::max(std::fabs(least), std::fabs(most));
+    m_balance.SetForceScale(std::max(std::fabs(least), std::fabs(most)));
     error.fault = SECTION_FAULT::AxialBeyond;
     error.axialMin = least, error.axialMax = most;
     // Out from no strain, so that what descends beyond a peak comes last.
@@ -234,15 +71,15 @@ bool CCurvaturePath::Start(T_STATE& first, T_SECTION_ERROR& error)
     for (std::size_t i = zero; i-- > 0 && !at;)
         if (passes(i, i + 1)) at = i;
     if (!at) return false;
-    const auto miss = [&](double e) { return Balance({e, 0.0, 0.0}).force - m_request.axial; };
+    const auto miss = [&](double e) { return m_balance.UniformForce(e) - m_request.axial; };
     const T_BRACKET root =
         BracketRoot(miss, strains[*at], forces[*at] - m_request.axial, strains[*at + 1],
-                    forces[*at + 1] - m_request.axial, kTol * m_force);
-    first = StateOf({root.x, 0.0, 0.0});
+                    forces[*at + 1] - m_request.axial, kTol * m_balance.ForceScale());
+    first = m_balance.StateOf({root.x, 0.0, 0.0});
     error.fault = SECTION_FAULT::NotConverged;
     // Without curvature the direction of the moment can only be had by bending across.
     if (!m_request.ofMoment) return true;
-    const auto turned = Newton(first.at, true);
+    const auto turned = m_balance.Near(first.at);
     if (turned)
         first = *turned;
     else
@@ -253,30 +90,29 @@ bool CCurvaturePath::Start(T_STATE& first, T_SECTION_ERROR& error)
 // ---- march --------------------------------------------------------------------------------------
 
 template <class F>
-std::optional<CCurvaturePath::T_STATE> CCurvaturePath::Locate(const T_STATE& before,
-                                                              const T_STATE& after, const F& value)
+std::optional<T_BENT_STATE> CCurvaturePath::Locate(const T_BENT_STATE& before,
+                                                   const T_BENT_STATE& after, const F& value)
 {
-    std::optional<T_STATE> found = after;
     const auto at = [&](double curvature) {
-        found = Reach(before, curvature, kReachHalvings);
+        const auto found = m_balance.Reach(before, curvature);
         return found ? value(*found) : std::numeric_limits<double>::quiet_NaN();
     };
     const T_BRACKET root =
         BracketRoot(at, before.at.along, value(before), after.at.along, value(after), kTol);
-    return Reach(before, root.x, kReachHalvings);
+    return m_balance.Reach(before, root.x);
 }
 
 /// The largest moment near the best state of the path, by golden section.
 double CCurvaturePath::LargestMoment()
 {
     const auto best =
-        std::ranges::max_element(m_path, {}, [](const T_STATE& s) { return s.point.moment; });
-    const T_STATE& from = best == m_path.begin() ? *best : *(best - 1);
+        std::ranges::max_element(m_path, {}, [](const T_BENT_STATE& s) { return s.point.moment; });
+    const T_BENT_STATE& from = best == m_path.begin() ? *best : *(best - 1);
     double lo = from.at.along, hi = (best + 1 == m_path.end() ? best : best + 1)->at.along;
     double largest = best->point.moment;
     constexpr double kGolden = 1.0 / std::numbers::phi;
     const auto at = [&](double curvature) {
-        const auto state = Reach(from, curvature, kReachHalvings);
+        const auto state = m_balance.Reach(from, curvature);
         const double moment = state ? state->point.moment : best->point.moment;
         largest = std::max(largest, moment);
         return moment;
@@ -292,21 +128,22 @@ double CCurvaturePath::LargestMoment()
 }
 
 /// Whether the path ends between its last state and this one; adds the end.
-bool CCurvaturePath::EndsAt(const T_STATE& state, T_MOMENT_CURVATURE& out)
+bool CCurvaturePath::EndsAt(const T_BENT_STATE& state, T_MOMENT_CURVATURE& out)
 {
-    std::optional<T_STATE> end;
+    std::optional<T_BENT_STATE> end;
     if (state.limit.part >= 1.0) {
         out.end = CURVATURE_END::StrainLimit;
         out.governs = state.limit.fibre;
-        end = Locate(m_path.back(), state, [](const T_STATE& s) { return s.limit.part - 1.0; });
+        end =
+            Locate(m_path.back(), state, [](const T_BENT_STATE& s) { return s.limit.part - 1.0; });
     } else {
-        const auto best =
-            std::ranges::max_element(m_path, {}, [](const T_STATE& s) { return s.point.moment; });
+        const auto best = std::ranges::max_element(
+            m_path, {}, [](const T_BENT_STATE& s) { return s.point.moment; });
         if (!(state.point.moment < kLoss * best->point.moment)) return false;
         const double left = kLoss * LargestMoment();
         out.end = CURVATURE_END::MomentLoss;
         end = Locate(m_path.back(), state,
-                     [&](const T_STATE& s) { return s.point.moment / left - 1.0; });
+                     [&](const T_BENT_STATE& s) { return s.point.moment / left - 1.0; });
     }
     m_path.push_back(end ? *end : state);
     return true;
@@ -315,15 +152,15 @@ bool CCurvaturePath::EndsAt(const T_STATE& state, T_MOMENT_CURVATURE& out)
 bool CCurvaturePath::March(T_MOMENT_CURVATURE& out)
 {
     double least = std::numeric_limits<double>::infinity();
-    for (const T_MARK& mark : m_view.Yields())
-        least = std::min(least, std::fabs(mark.strain) / m_depth);
+    for (const T_MARK& mark : m_balance.View().Yields())
+        least = std::min(least, std::fabs(mark.strain) / m_balance.Depth());
     double step = kFirstStep * least;
     for (int i = 0; i < kMarchSteps; ++i) {
-        const T_STATE before = m_path.back();
+        const T_BENT_STATE before = m_path.back();
         double to = before.at.along + step;
         const bool last = m_request.maxCurvature > 0.0 && to >= m_request.maxCurvature;
         if (last) to = m_request.maxCurvature;
-        const auto state = Solve(before, to);
+        const auto state = m_balance.Reach(before, to, 0);
         if (!state) {
             step *= 0.5;
             if (step > kStuck * (before.at.along + least)) continue;
@@ -345,15 +182,15 @@ bool CCurvaturePath::March(T_MOMENT_CURVATURE& out)
 
 bool CCurvaturePath::Fill(T_MOMENT_CURVATURE& out)
 {
-    T_STATE yield = m_path.back();
+    T_BENT_STATE yield = m_path.back();
     const auto first =
-        std::ranges::find_if(m_path, [](const T_STATE& s) { return s.yield.part >= 1.0; });
+        std::ranges::find_if(m_path, [](const T_BENT_STATE& s) { return s.yield.part >= 1.0; });
     if (first != m_path.end()) {
         yield = *first;
         out.yields = first->yield.fibre;
         if (first != m_path.begin()) {
-            const auto at =
-                Locate(*(first - 1), *first, [](const T_STATE& s) { return s.yield.part - 1.0; });
+            const auto at = Locate(*(first - 1), *first,
+                                   [](const T_BENT_STATE& s) { return s.yield.part - 1.0; });
             if (!at) return false;
             yield = *at;
         }
@@ -365,7 +202,7 @@ bool CCurvaturePath::Fill(T_MOMENT_CURVATURE& out)
             const double curvature = from + (to - from) * double(i) / double(count);
             while (next + 1 < m_path.size() && m_path[next + 1].at.along <= curvature)
                 ++next;
-            const auto state = Reach(m_path[next], curvature, kReachHalvings);
+            const auto state = m_balance.Reach(m_path[next], curvature);
             if (!state) return false;
             out.points.push_back(state->point);
         }
@@ -417,7 +254,7 @@ void Idealise(T_MOMENT_CURVATURE& out)
 
 int CCurvaturePath::Run(T_MOMENT_CURVATURE& out, T_SECTION_ERROR& error)
 {
-    T_STATE first;
+    T_BENT_STATE first;
     error = {};
     if (!Start(first, error)) return 0;
     m_path.assign(1, first);
