@@ -105,6 +105,7 @@ enum class SECTION_FAULT {
     RingArea,        // region, ring: without area
     RingCrossed,     // region, ring: meets itself or another ring of the region
     HoleOutside,     // region, ring: not within its outline
+    RegionsOverlap,  // region, otherRegion: seen from their borders
     BarArea,         // bar: not above 0
     BarOutside,      // bar: in no region of concrete
     BarsOverlap,     // bar, otherBar
@@ -118,7 +119,7 @@ enum class SECTION_FAULT {
 };
 struct T_SECTION_ERROR {
     SECTION_FAULT fault = SECTION_FAULT::None;
-    long law = -1, region = -1, ring = -1, bar = -1, otherBar = -1;
+    long law = -1, region = -1, otherRegion = -1, ring = -1, bar = -1, otherBar = -1;
     double axialMin = 0.0, axialMax = 0.0;
 };
 

@@ -11,6 +11,8 @@ namespace solver {
 namespace {
 
 constexpr double kLeastArea = 1e-12;   // of a ring, over the square of its extent
+constexpr int kBorderPlaces = 8;       // of a way, where regions must not overlap
+constexpr double kJustWithin = 1e-6;   // of the length of the way
 constexpr double kTouching = 1e-9;     // bars may touch; part of the distance
 constexpr double kLargestStrain = 1.0; // of a law
 
@@ -92,11 +94,11 @@ bool CheckRegion(const T_SECTION_REGION& region, T_SECTION_ERROR& error)
     return true;
 }
 
-bool InRegion(const T_SECTION_REGION& region, const T_SECTION_BAR& bar)
+bool InRegion(const T_SECTION_REGION& region, double y, double z)
 {
-    bool in = Within(region.rings[0], bar.y, bar.z);
+    bool in = Within(region.rings[0], y, z);
     for (std::size_t i = 1; i < region.rings.size() && in; ++i)
-        in = !Within(region.rings[i], bar.y, bar.z);
+        in = !Within(region.rings[i], y, z);
     return in;
 }
 
@@ -117,7 +119,7 @@ bool CheckBar(const T_SECTION_MODEL& m, std::size_t i, std::size_t& host, T_SECT
     if (bar.law >= m.laws.size()) return Set(error, SECTION_FAULT::NoSuchLaw);
     if (m.laws[bar.law].kind != STRESS_LAW::Steel) return Set(error, SECTION_FAULT::WrongLaw);
     const auto in = std::ranges::find_if(m.regions, [&](const T_SECTION_REGION& r) {
-        return m.laws[r.law].kind != STRESS_LAW::Steel && InRegion(r, bar);
+        return m.laws[r.law].kind != STRESS_LAW::Steel && InRegion(r, bar.y, bar.z);
     });
     if (in == m.regions.end()) return Set(error, SECTION_FAULT::BarOutside);
     host = in->law;
@@ -155,6 +157,34 @@ void AddRing(const T_RING& ring, bool hole, std::size_t region, T_SECTION_SHAPE&
     }
 }
 
+/// Whether a place just within the border of a region lies in another region too.
+bool CheckApart(const T_SECTION_SHAPE& shape, T_SECTION_ERROR& error)
+{
+    const T_SECTION_MODEL& m = shape.model;
+    const auto apart = [&](std::size_t region, double y, double z) {
+        for (std::size_t i = 0; i < m.regions.size(); ++i)
+            if (i != region && InRegion(m.regions[i], m.momentY + y, m.momentZ + z)) {
+                error.region = static_cast<long>(std::max(i, region));
+                error.otherRegion = static_cast<long>(std::min(i, region));
+                return Set(error, SECTION_FAULT::RegionsOverlap);
+            }
+        return true;
+    };
+    for (int k = 0; k < kBorderPlaces; ++k) {
+        const double at = (k + 0.5) / kBorderPlaces;
+        for (const T_EDGE& e : shape.edges) {
+            const double dy = e.y1 - e.y0, dz = e.z1 - e.z0, in = e.sign * kJustWithin;
+            if (!apart(e.region, e.y0 + at * dy - in * dz, e.z0 + at * dz + in * dy)) return false;
+        }
+        for (const T_ARC& a : shape.arcs) {
+            const double angle = a.from + at * a.sweep, r = a.radius * (1.0 - a.sign * kJustWithin);
+            if (!apart(a.region, a.y + r * std::cos(angle), a.z + r * std::sin(angle)))
+                return false;
+        }
+    }
+    return true;
+}
+
 bool CheckParts(const T_SECTION_MODEL& m, T_SECTION_ERROR& error)
 {
     if (!std::isfinite(m.momentY) || !std::isfinite(m.momentZ))
@@ -190,6 +220,7 @@ int MakeShape(const T_SECTION_MODEL& model, T_SECTION_SHAPE& out, T_SECTION_ERRO
     for (std::size_t r = 0; r < model.regions.size(); ++r)
         for (const T_RING& ring : model.regions[r].rings)
             AddRing(ring, &ring != &model.regions[r].rings.front(), r, shape);
+    if (!CheckApart(shape, error)) return 0;
     for (std::size_t i = 0; i < model.bars.size(); ++i) {
         const T_SECTION_BAR& bar = model.bars[i];
         std::size_t host = 0;

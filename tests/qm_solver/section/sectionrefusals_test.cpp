@@ -67,6 +67,20 @@ TEST(SectionRefusals, NameTheFaultAndItsPlace)
         T_CAPACITY out;
         EXPECT_EQ(0, s.AtAxial(0.0, 0.0, out, e)) << c.label;
     }
+    // A region within another, the same again, one that cuts across; its neighbours may touch.
+    for (const auto& [ring, fault] : {std::pair{RectangleRing(60, 60, 100, 0), F::RegionsOverlap},
+                                      std::pair{RectangleRing(300, 500), F::RegionsOverlap},
+                                      std::pair{RectangleRing(400, 100, 0, 280), F::RegionsOverlap},
+                                      std::pair{RectangleRing(300, 100, 0, 300), F::None},
+                                      std::pair{T_RING{{0, 40, 1.0}, {0, -40, 1.0}}, F::None}}) {
+        T_SECTION_MODEL m = Good();
+        m.regions.push_back({{ring}, 1});
+        CSectionSolver s;
+        T_SECTION_ERROR e;
+        EXPECT_EQ(fault == F::None, s.Prepare(m, e) == 1);
+        EXPECT_EQ(fault, e.fault);
+        EXPECT_EQ(fault == F::None ? -1 : 0, e.otherRegion);
+    }
     // Bars that touch: 400 mm2 is 22.568 across.
     T_SECTION_MODEL touching = Good();
     touching.bars[1] = {100 - 22.5676, 200, 400, 1};
