@@ -38,9 +38,10 @@ inline auto Numbers(const T_SECTION_RESPONSE& r)
     return std::tie(r.axial, r.My, r.Mz, r.tangent);
 }
 
-/// A state of capacity. Where the forces jump while the neutral axis moves (a bar at the edge of a
-/// block), the point lies on the straight line over the jump; plane and fibre are those of one
-/// side.
+/// A state of capacity. Where the forces jump while the neutral axis moves (concrete around a bar
+/// that spalls), the point lies on the straight line over the jump; plane and fibre are those of
+/// one side. As the edge of a block passes a bar, the force falls by its concrete: three states
+/// have one axial force there, and any of them is given.
 struct T_CAPACITY {
     double axial = 0.0, My = 0.0, Mz = 0.0;
     T_STRAIN_PLANE plane; // of a plastic section: the sides of the neutral axis alone

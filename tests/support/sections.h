@@ -62,4 +62,19 @@ inline CSectionSolver Prepared(const T_SECTION_MODEL& model)
     return solver;
 }
 
+inline T_CAPACITY CapacityAt(const CSectionSolver& s, double direction, double place)
+{
+    T_CAPACITY out;
+    T_SECTION_ERROR error;
+    EXPECT_EQ(1, s.Capacity(direction, place, out, error)) << static_cast<int>(error.fault);
+    return out;
+}
+inline T_CAPACITY CapacityAtAxial(const CSectionSolver& s, double direction, double axial)
+{
+    T_CAPACITY out;
+    T_SECTION_ERROR error;
+    EXPECT_EQ(1, s.AtAxial(direction, axial, out, error)) << static_cast<int>(error.fault);
+    return out;
+}
+
 } // namespace solver

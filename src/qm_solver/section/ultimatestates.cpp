@@ -65,7 +65,7 @@ void CUltimateStates::Turn(double direction)
     for (const T_MARK& limit : m_view.Limits()) {
         if (limit.strain < 0.0)
             m_tensionEnds = true;
-        else if (!limit.pivotC)
+        else
             m_top = std::max(m_top, limit.s);
     }
     const bool plastic = m_view.Shape().model.plastic;

@@ -45,11 +45,7 @@ T_SECTION_MODEL Moved(T_SECTION_MODEL m, const std::function<void(double&, doubl
 
 T_CAPACITY AtAxial(const T_SECTION_MODEL& m, double direction, double axial)
 {
-    T_CAPACITY out;
-    T_SECTION_ERROR error;
-    EXPECT_EQ(1, Prepared(m).AtAxial(direction, axial, out, error))
-        << static_cast<int>(error.fault);
-    return out;
+    return CapacityAtAxial(Prepared(m), direction, axial);
 }
 
 } // namespace
@@ -110,6 +106,24 @@ TEST(SectionInvariants, SquareRepeatsAtAQuarterTurnAndCircleAtAnyAngle)
         EXPECT_NEAR(M * std::cos(direction), p.My, 1e-9 * M);
         EXPECT_NEAR(M * std::sin(direction), p.Mz, 1e-9 * M);
     }
+}
+
+// Also where a bar passes the edge of a block while the axis turns.
+TEST(SectionInvariants, TheMomentPointsWhereItIsAskedFor)
+{
+    T_SECTION_MODEL m = Ell(BlockOf(30, 0.84));
+    T_SECTION_ERROR error;
+    T_CAPACITY out;
+    for (int i = 0; i < 120; ++i) {
+        const double direction = 2 * pi * i / 120;
+        ASSERT_EQ(1, Prepared(m).TowardsMoment(direction, 1.5e6, out, error)) << i;
+        const double moment = std::hypot(out.My, out.Mz);
+        EXPECT_NEAR(moment * std::cos(direction), out.My, 1e-9 * moment) << i;
+        EXPECT_NEAR(moment * std::sin(direction), out.Mz, 1e-9 * moment) << i;
+    }
+    m.momentZ = 2000; // above all: compression below it can't bend upwards
+    EXPECT_EQ(0, Prepared(m).TowardsMoment(0.0, 1.5e6, out, error));
+    EXPECT_EQ(SECTION_FAULT::NoSuchMoment, error.fault);
 }
 
 TEST(SectionInvariants, TangentIsTheDerivative)

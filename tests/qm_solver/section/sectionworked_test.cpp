@@ -9,20 +9,6 @@ using std::numbers::pi;
 
 namespace {
 
-T_CAPACITY At(const CSectionSolver& s, double direction, double place)
-{
-    T_CAPACITY out;
-    T_SECTION_ERROR error;
-    EXPECT_EQ(1, s.Capacity(direction, place, out, error)) << static_cast<int>(error.fault);
-    return out;
-}
-T_CAPACITY AtAxial(const CSectionSolver& s, double direction, double axial)
-{
-    T_CAPACITY out;
-    T_SECTION_ERROR error;
-    EXPECT_EQ(1, s.AtAxial(direction, axial, out, error)) << static_cast<int>(error.fault);
-    return out;
-}
 T_SECTION_MODEL Aci(double b, double h, double fc, double beta1,
                     const std::vector<std::array<double, 3>>& bars)
 {
@@ -47,14 +33,14 @@ TEST(SectionWorked, AciColumnOfTheTextbook)
                               {4 * y, 43.9, 257, 44.169, 257.557}};
     for (const auto& [strain, axial, moment, axial6, moment6] : rows) {
         const double c = 13.5 * 0.003 / (0.003 + strain);
-        const T_CAPACITY p = At(s, 0.0, c / 16);
+        const T_CAPACITY p = CapacityAt(s, 0.0, c / 16);
         EXPECT_NEAR(axial, p.axial, 0.012 * axial);
         EXPECT_NEAR(moment, p.My / 12, 0.012 * moment);
         EXPECT_NEAR(axial6, p.axial, 1e-3);
         EXPECT_NEAR(moment6, p.My / 12, 1e-3);
     }
-    EXPECT_NEAR(1534.0, At(s, 0.0, 2.0).axial, 1e-9);
-    EXPECT_NEAR(-480.0, At(s, 0.0, 0.0).axial, 1e-9);
+    EXPECT_NEAR(1534.0, CapacityAt(s, 0.0, 2.0).axial, 1e-9);
+    EXPECT_NEAR(-480.0, CapacityAt(s, 0.0, 0.0).axial, 1e-9);
 }
 
 // Hand calculation, kip and in, every value to the digits shown: 16 x 16 in, 8 No. 8 in three
@@ -77,7 +63,7 @@ TEST(SectionWorked, AciColumnByHand)
     EXPECT_NEAR(0.0, bending.axial, 1e-8);
     EXPECT_NEAR(2270.24, bending.My, 5e-3);
     EXPECT_NEAR(3.70161, 8.0 + bending.plane.axial / bending.plane.overZ, 2e-5);
-    const T_CAPACITY at5 = At(s, 0.0, 13.625 * 0.003 / 0.008 / 16);
+    const T_CAPACITY at5 = CapacityAt(s, 0.0, 13.625 * 0.003 / 0.008 / 16);
     EXPECT_NEAR(118.578, at5.axial, 1e-3);
     EXPECT_NEAR(2752.28, at5.My, 5e-3);
     for (const T_CAPACITY& p : curve.points) // no point above the largest, each in its order
@@ -98,14 +84,14 @@ TEST(SectionWorked, AciInclinedAxisAndBeamOfTheTextbook)
     const double depth = 16 * (std::sin(pi / 6) + std::cos(pi / 6));
     const double c = 8 * (std::sin(pi / 6) + std::cos(pi / 6)) + 2.0 * std::cos(pi / 6);
     EXPECT_NEAR(12.66, c, 5e-3);
-    const T_CAPACITY p = At(s, -pi / 6, c / depth);
+    const T_CAPACITY p = CapacityAt(s, -pi / 6, c / depth);
     EXPECT_NEAR(485, p.axial, 4.85);
     EXPECT_NEAR(485.658, p.axial, 1e-3);
     EXPECT_NEAR(2366.09, p.My, 1e-2);
     EXPECT_NEAR(-1145.96, p.Mz, 1e-2);
     const CSectionSolver beam =
         Prepared(Aci(12, 20, 4, 0.85, {{0, -7.5, 4.0}, {0, -5.4, 2.0}, {0, 7.5, 3.0}}));
-    const T_CAPACITY b = AtAxial(beam, 0.0, 0.0);
+    const T_CAPACITY b = CapacityAtAxial(beam, 0.0, 0.0);
     EXPECT_NEAR(428, b.My / 12, 0.01 * 428);
     EXPECT_NEAR(426.67, b.My / 12, 5e-3);
     EXPECT_NEAR(6.189, 10 + b.plane.axial / b.plane.overZ, 1e-3);
@@ -138,7 +124,7 @@ TEST(SectionWorked, EurocodeColumnFollowsTheClosedForm)
         const T_CAPACITY& balanced = curve.points[static_cast<std::size_t>(curve.balanced)];
         EXPECT_NEAR(axial, balanced.axial, 1e-10 * axial) << f;
         EXPECT_NEAR(-moment, balanced.My, 1e-10 * moment) << f;
-        EXPECT_NEAR(moment, AtAxial(s, 0.5 * pi, axial).Mz, 1e-10 * moment) << f;
+        EXPECT_NEAR(moment, CapacityAtAxial(s, 0.5 * pi, axial).Mz, 1e-10 * moment) << f;
         const double squash = f * 160000 + 2500 * (std::min(500.0, 2e5 * peak) - f);
         EXPECT_NEAR(squash, curve.points.front().axial, 1e-9 * squash) << f;
         EXPECT_NEAR(-1250000, curve.points.back().axial, 1e-6) << f;
@@ -149,12 +135,15 @@ TEST(SectionWorked, EurocodeColumnFollowsTheClosedForm)
         SectionOf(RectangleRing(400, 400), ConcreteOf(30), SteelOf(500, 2e5, 1000, 0.01), bars);
     const CSectionSolver s = Prepared(m);
     const double x = 350 * 35.0 / 135;
-    EXPECT_EQ(FIBRE_KIND::Concrete, At(s, 0.0, (x + 1) / 400).governs.kind);
-    const T_CAPACITY low = At(s, 0.0, x / 3 / 400);
+    EXPECT_EQ(FIBRE_KIND::Concrete, CapacityAt(s, 0.0, (x + 1) / 400).governs.kind);
+    const T_CAPACITY low = CapacityAt(s, 0.0, x / 3 / 400);
     EXPECT_EQ(FIBRE_KIND::Bar, low.governs.kind);
     EXPECT_TRUE(low.governs.tension);
     EXPECT_NEAR(0.01 * (x / 3) / (350 - x / 3), low.plane.axial + 200 * low.plane.overZ, 1e-12);
-    EXPECT_NEAR(-2500 * (500 + 1000 * (0.01 - 0.0025)), At(s, 0.0, -1.0).axial, 1e-6);
+    // The axis 800 above the lower edge: the edge has 400 / 750 of what the bars have.
+    const T_CAPACITY pulled = CapacityAt(s, 0.0, -0.5);
+    EXPECT_NEAR(-0.01 * 400 / 750, pulled.plane.axial + 200 * pulled.plane.overZ, 1e-12);
+    EXPECT_NEAR(-2500 * (500 + 1000 * (0.01 - 0.0025)), CapacityAt(s, 0.0, -1.0).axial, 1e-6);
 }
 
 // Full plasticity. I 300 x 150 x 7.1 x 10.7: axis at +-a gives N = f (area within), M = f (first
@@ -183,9 +172,10 @@ TEST(SectionWorked, SteelShapesArePlastic)
                                        {-w, -f},
                                        {-75, -f}}});
     const double zy = 150 * 10.7 * 289.3 + 7.1 * f * f;
-    EXPECT_NEAR(235 * (zy - 7.1 * 2500), AtAxial(i, 0, 235 * 710.0).My, 1);
-    EXPECT_NEAR(-235 * 221250.0, AtAxial(i, pi, -235 * (2 * f * 7.1 + 2 * 150 * 5.7)).My, 1);
-    EXPECT_NEAR(235 * 21.4 * 3125, AtAxial(i, pi / 2, 235 * (2 * f * 7.1 + 2140)).Mz, 1);
+    EXPECT_NEAR(235 * (zy - 7.1 * 2500), CapacityAtAxial(i, 0, 235 * 710.0).My, 1);
+    EXPECT_NEAR(-235 * 221250.0, CapacityAtAxial(i, pi, -235 * (2 * f * 7.1 + 2 * 150 * 5.7)).My,
+                1);
+    EXPECT_NEAR(235 * 21.4 * 3125, CapacityAtAxial(i, pi / 2, 235 * (2 * f * 7.1 + 2140)).Mz, 1);
     T_CAPACITY largest;
     T_SECTION_ERROR error;
     double place = 0.0;
@@ -194,7 +184,7 @@ TEST(SectionWorked, SteelShapesArePlastic)
     EXPECT_NEAR(0.5, place, 1e-6);
     const CSectionSolver tube = plastic({CircleRing(100), CircleRing(98)});
     const double area = pi * (10000 - 9604), Z = 4.0 / 3 * (1e6 - 98.0 * 98 * 98);
-    const T_CAPACITY half = AtAxial(tube, 0.3, 235 * area / 2);
+    const T_CAPACITY half = CapacityAtAxial(tube, 0.3, 235 * area / 2);
     EXPECT_NEAR(std::sqrt(0.5), std::hypot(half.My, half.Mz) / (235 * Z), 5e-4);
     const CSectionSolver square = plastic({RectangleRing(60, 60)});
     ASSERT_EQ(1, square.TowardsMoment(pi / 4, 0.0, largest, error));
