@@ -180,8 +180,14 @@ void AddPlace(const CStressLaw& law, const T_LAW_PIECE& piece, double strain, co
     }
 }
 
-/// f(at, weight) over the way from a to b; the points gather at the end that is nearer to the root
-/// of a broken power: w^4 makes it smooth.
+/// f(at, weight) over the way from a to b.
+template <class F>
+void ForEven(double a, double b, const F& f)
+{
+    ForGauss16([&](double at, double weight) { f(a + (b - a) * at, (b - a) * weight); });
+}
+
+/// The points gather at the end that is nearer to the root of a broken power: w^4 makes it smooth.
 template <class F>
 void ForGathered(double a, double b, bool atB, const F& f)
 {
@@ -218,9 +224,11 @@ void CSectionView::SumLine(const T_LINE& line, double e0, double kappa, T_SUMS& 
         if (piece.shape == LAW_SHAPE::Polynomial) {
             for (const auto& [at, weight] : kGauss3)
                 add(a + (b - a) * at, (b - a) * weight);
+        } else if (!piece.root) {
+            ForEven(a, b, add);
         } else {
-            const bool atB = std::fabs(ea + b * (eb - ea) - piece.root) <
-                             std::fabs(ea + a * (eb - ea) - piece.root);
+            const bool atB = std::fabs(ea + b * (eb - ea) - *piece.root) <
+                             std::fabs(ea + a * (eb - ea) - *piece.root);
             ForGathered(a, b, atB, add);
         }
     }
@@ -253,12 +261,17 @@ void CSectionView::SumBow(const T_BOW& bow, double e0, double kappa, T_SUMS& sum
                                                     both * (bow.t * bow.t + across * across / 3.0)};
                 AddPlace<kTangent>(law, piece, mid + kappa * s, place, sums);
             };
-            if (piece.shape == LAW_SHAPE::Polynomial)
-                ForGauss16([&](double at, double w) { add(a + (b - a) * at, (b - a) * w); });
-            else {
-                const double c = 0.5 * (a + b); // two panels: strains bend at 0 and pi
-                const bool atB =
-                    std::fabs(angle(piece.root) - b) < std::fabs(angle(piece.root) - a);
+            if (piece.shape == LAW_SHAPE::Polynomial) {
+                ForEven(a, b, add);
+                continue;
+            }
+            const double c = 0.5 * (a + b); // two panels: strains bend at 0 and pi
+            if (!piece.root) {
+                ForEven(a, c, add);
+                ForEven(c, b, add);
+            } else {
+                const double root = angle(*piece.root);
+                const bool atB = std::fabs(root - b) < std::fabs(root - a);
                 ForGathered(a, c, atB, add);
                 ForGathered(c, b, atB, add);
             }

@@ -5,6 +5,7 @@
 
 #include <array>
 #include <limits>
+#include <optional>
 #include <span>
 
 namespace solver {
@@ -17,8 +18,9 @@ struct T_LAW_PIECE {
     double to = std::numeric_limits<double>::infinity();
     LAW_SHAPE shape = LAW_SHAPE::Polynomial;
     std::array<double, 3> c{}; // of a polynomial, by rising power
-    /// Where a broken power begins, no polynomial follows it; quadrature gathers points there.
-    double root = 0.0;
+    /// Where a broken power begins, no polynomial follows it; quadrature gathers points there. None
+    /// beside a smooth piece.
+    std::optional<double> root;
 
     bool Zero() const
     {
@@ -41,13 +43,15 @@ public:
     double Stress(double strain) const { return Stress(PieceAt(strain), strain); }
 
 private:
-    void AddUpTo(double to, LAW_SHAPE shape, std::array<double, 3> c = {}, double root = 0.0);
+    void AddUpTo(double to, LAW_SHAPE shape, std::array<double, 3> c = {},
+                 std::optional<double> root = {});
+    void AddMander(double to);
     void MakeConcrete();
     void MakeSteel(bool plastic);
 
     T_STRESS_LAW m_law;
     double m_power = 0.0; // Mander: r
-    std::array<T_LAW_PIECE, 8> m_pieces;
+    std::array<T_LAW_PIECE, 9> m_pieces;
     std::size_t m_count = 0;
 };
 

@@ -208,3 +208,23 @@ TEST(SectionWorked, FilletHasItsClosedForm)
     EXPECT_NEAR(force * away, out.My, 1e-10 * force * away);
     EXPECT_NEAR(force * away, out.Mz, 1e-10 * force * away);
 }
+
+// From 0 to x times the peak strain over a rectangle: r = 2 (modulus twice the secant) is 2 u / (1
+// + u2), its integral ln(1 + x2); r = 4 (modulus 4/3) is 4 u / (3 + u4), 2 / sqrt 3 atan(x2 / sqrt
+// 3).
+TEST(SectionWorked, ManderCurveHasItsIntegral)
+{
+    for (const double x : {0.3, 1.0, 2.7, 9.0})
+        for (const double r : {2.0, 4.0}) {
+            T_STRESS_LAW law = ConcreteOf(35, 0.004, 0.05);
+            law.kind = STRESS_LAW::Mander, law.modulus = 35 / 0.004 * r / (r - 1);
+            T_SECTION_RESPONSE out;
+            T_SECTION_ERROR error;
+            ASSERT_EQ(1, Prepared(SectionOf(RectangleRing(250, 600), law))
+                             .Respond({0.002 * x, 0.004 * x / 600, 0.0}, out, error));
+            const double integral = r == 2.0
+                                        ? std::log(1 + x * x)
+                                        : 2 / std::sqrt(3.0) * std::atan(x * x / std::sqrt(3.0));
+            EXPECT_NEAR(35 * 250 * 600 / x * integral, out.axial, 1e-10 * 35 * 250 * 600) << x << r;
+        }
+}
