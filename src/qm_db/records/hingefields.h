@@ -281,6 +281,16 @@ void CaseFields(V& v, T_FIELD_REF<V, T_HINGE_LENGTH> r)
     v.Opt("span", r.span, 0.0, kDimLength);
 }
 
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_GENERATED> r)
+{
+    v.Need("code", r.code);
+    v.Opt("secondary", r.secondary, false);
+    v.Opt("axial_I", r.axial.I, 0.0, kDimForce);
+    v.Opt("axial_J", r.axial.J, 0.0, kDimForce);
+    v.Need("inputs", r.inputs);
+}
+
 /// Dimensions of a component's curve in a definition.
 inline T_CURVE_DIMS CurveDims(std::size_t component, HINGE_DEFINITION definition)
 {
@@ -325,6 +335,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_PHGT_D> r)
     v.Part("length", r.length);
     v.Opt("withhold_mz_length", r.withholdMzLength, false);
     v.PartIf("masonry", r.masonry);
+    v.PartIf("generated", r.generated);
 }
 
 using T_HINGE_STRENGTHS = std::array<T_SIDES<double>, 6>;

@@ -192,6 +192,17 @@ struct T_HINGE_LENGTH {
     bool operator==(const T_HINGE_LENGTH&) const = default;
 };
 
+/// Where a generated hinge type came from.
+struct T_GENERATED {
+    std::string code;       // "ASCE41-17"
+    bool secondary = false; // member
+    T_ENDS<double> axial{}; // forces that it was made for, compression positive
+    /// What went into it, in SI, in the order of the generator: tells whether section, material,
+    /// member or loads have changed since.
+    std::vector<double> inputs{};
+    bool operator==(const T_GENERATED&) const = default;
+};
+
 /// Hinge type.
 struct T_PHGT_D {
     std::string name;
@@ -210,6 +221,7 @@ struct T_PHGT_D {
     T_HINGE_LENGTH length;
     bool withholdMzLength = false; // Mz has no hinge length although its curve asks for one
     std::optional<T_MASONRY_HINGE> masonry; // present: the masonry flag is set
+    std::optional<T_GENERATED> generated{};
     bool operator==(const T_PHGT_D&) const = default;
 };
 

@@ -114,6 +114,17 @@ void CaseFields(V& v, T_FIELD_REF<V, T_EIGV_D> r)
 // ---- materials and sections ---------------------------------------------------------------------
 
 template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_MATL_MEAN> r)
+{
+    v.Opt("fc", r.fc, 0.0, kDimStress);
+    v.Check("fc", r.fc >= 0.0, kNotNegative);
+    v.Opt("fy", r.fy, 0.0, kDimStress);
+    v.Check("fy", r.fy >= 0.0, kNotNegative);
+    v.Opt("fyw", r.fyw, 0.0, kDimStress);
+    v.Check("fyw", r.fyw >= 0.0, kNotNegative);
+}
+
+template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_MATL_D> r)
 {
     v.EnumOpt("type", r.type, MATL_CLASS::Steel, kMatlNames, "IDS_QM_CHOICE_MATERIAL");
@@ -129,6 +140,10 @@ void CaseFields(V& v, T_FIELD_REF<V, T_MATL_D> r)
     v.Opt("fck", r.fck, 0.0, kDimStress);
     v.Opt("fyk", r.fyk, 0.0, kDimStress);
     v.Opt("Es", r.Es, 0.0, kDimStress);
+    v.PartIf("mean", r.mean);
+    v.EnumIf("knowledge", r.knowledge, kKnowledgeNames, "IDS_QM_CHOICE_KNOWLEDGE");
+    v.OptIf("confidence_factor", r.confidence);
+    v.Check("confidence_factor", r.confidence.value_or(1.0) >= 1.0, "IDS_QM_CASE_CONFIDENCE");
 }
 
 template <class V>
@@ -137,6 +152,26 @@ void CaseFields(V& v, T_FIELD_REF<V, T_REBAR> r)
     v.Need("y", r.y, kDimLength);
     v.Need("z", r.z, kDimLength);
     v.Need("area", r.area, kDimArea);
+}
+
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_SECT_DETAIL> r)
+{
+    v.Need("cover", r.cover, kDimLength);
+    v.Check("cover", r.cover >= 0.0, kNotNegative);
+    v.Need("stirrup_diameter", r.stirrupDiameter, kDimLength);
+    v.Check("stirrup_diameter", r.stirrupDiameter > 0.0, "IDS_QM_CASE_ABOVE_0");
+    v.Need("stirrup_spacing", r.stirrupSpacing, kDimLength);
+    v.Check("stirrup_spacing", r.stirrupSpacing > 0.0, "IDS_QM_CASE_ABOVE_0");
+    v.Opt("legs_y", r.legsY, 2);
+    v.Check("legs_y", r.legsY >= 2, "IDS_QM_CASE_LEGS");
+    v.Opt("legs_z", r.legsZ, 2);
+    v.Check("legs_z", r.legsZ >= 2, "IDS_QM_CASE_LEGS");
+    v.EnumOpt("hooks", r.hooks, STIRRUP_HOOKS::Hooks135, kHookNames, "IDS_QM_CHOICE_HOOKS");
+    v.Opt("lap_length", r.lapLength, 0.0, kDimLength);
+    v.Check("lap_length", r.lapLength >= 0.0, kNotNegative);
+    v.Opt("ties_in_core", r.tiesInCore, true);
+    v.Opt("poor_splice", r.poorSplice, false);
 }
 
 template <class V>
@@ -170,6 +205,9 @@ void CaseFields(V& v, T_FIELD_REF<V, T_SECT_D> r)
     v.Part("factors_I", r.factorsI);
     v.Part("factors_J", r.factorsJ);
     v.List("bars", r.bars);
+    v.PartIf("detailing", r.detailing);
+    v.Check("detailing", LeavesCore(r), "IDS_QM_CASE_COVER");
+    v.Check("bars", !LeavesCore(r) || HoldsBars(r), "IDS_QM_CASE_BARS_OUTSIDE");
 }
 
 // ---- elements and constraints -------------------------------------------------------------------

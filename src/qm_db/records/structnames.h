@@ -9,6 +9,10 @@ inline constexpr std::array<const char*, 6> kReleaseNames{"Dx", "Dy", "Dz", "Rx"
 inline constexpr std::array<const char*, 3> kAxisNames{"X", "Y", "Z"};
 inline constexpr std::array<const char*, 3> kPlaneNames{"XY", "XZ", "YZ"};
 
+/// By STIRRUP_HOOKS, by MATL_KNOWLEDGE.
+inline constexpr std::array<const char*, 3> kHookNames{"135", "90", "none"};
+inline constexpr std::array<const char*, 3> kKnowledgeNames{"KL1", "KL2", "KL3"};
+
 inline constexpr std::array<const char*, 2> kLoadAxesNames{"local", "global"};
 inline constexpr std::array<const char*, 3> kLoadDirectionNames{"x", "y", "z"};
 inline constexpr std::array<const char*, 3> kBeamLoadNames{"distributed", "point", "moment"};

@@ -2,7 +2,9 @@
 // the store every quantity is in SI.
 #pragma once
 
+#include <algorithm>
 #include <array>
+#include <cmath>
 #include <optional>
 #include <string>
 #include <vector>
@@ -18,6 +20,15 @@ struct T_ENDS {
 
 enum class MATL_CLASS { Concrete, Steel, Composite, Masonry };
 
+/// Mean or expected strengths of an existing material, as tests or its age give them.
+struct T_MATL_MEAN {
+    double fc = 0.0;  // of concrete
+    double fy = 0.0;  // of the bars
+    double fyw = 0.0; // of the stirrups; 0: as the bars
+    bool operator==(const T_MATL_MEAN&) const = default;
+};
+enum class MATL_KNOWLEDGE { KL1, KL2, KL3 };
+
 struct T_MATL_D {
     std::string name;
     MATL_CLASS type = MATL_CLASS::Steel;
@@ -30,6 +41,9 @@ struct T_MATL_D {
     std::optional<double> G{}; // shear modulus; absent: E / (2 (1 + nu))
     double density = 0.0;      // mass per volume
     double alpha = 0.0;        // thermal expansion, 1 / degree
+    std::optional<T_MATL_MEAN> mean{};
+    std::optional<MATL_KNOWLEDGE> knowledge{};
+    std::optional<double> confidence{}; // goes before that of the knowledge
     bool operator==(const T_MATL_D&) const = default;
 };
 
@@ -39,6 +53,20 @@ enum class SECT_SHAPE { Value, Rectangle, Circle, Pipe, Box, IShape };
 struct T_REBAR {
     double y = 0.0, z = 0.0, area = 0.0;
     bool operator==(const T_REBAR&) const = default;
+};
+
+enum class STIRRUP_HOOKS { Hooks135, Hooks90, None };
+
+/// How the bars of a section are held.
+struct T_SECT_DETAIL {
+    double cover = 0.0; // clear, to the stirrup
+    double stirrupDiameter = 0.0, stirrupSpacing = 0.0;
+    int legsY = 2, legsZ = 2; // legs along y and along z, which resist shear that way
+    STIRRUP_HOOKS hooks = STIRRUP_HOOKS::Hooks135;
+    double lapLength = 0.0;  // of the bars at the ends of the member; 0: no laps
+    bool tiesInCore = true;  // stirrups are anchored in the core
+    bool poorSplice = false; // bars slip in laps or anchorages before they yield
+    bool operator==(const T_SECT_DETAIL&) const = default;
 };
 
 /// Stiffness factors of a section at one end.
@@ -58,8 +86,27 @@ struct T_SECT_D {
     double Zy = 0.0, Zz = 0.0;               // plastic moduli
     T_SECT_FACTORS factorsI, factorsJ;
     std::vector<T_REBAR> bars; // concrete
+    std::optional<T_SECT_DETAIL> detailing{};
     bool operator==(const T_SECT_D&) const = default;
 };
+
+/// Of a rectangle with detailing: the stirrups leave a core within the cover.
+inline bool LeavesCore(const T_SECT_D& s)
+{
+    if (!s.detailing || s.shape != SECT_SHAPE::Rectangle) return true;
+    const double edge = s.detailing->cover + s.detailing->stirrupDiameter;
+    return 2.0 * edge < std::min(s.size[0], s.size[1]);
+}
+/// Likewise: the centre of every bar lies within the stirrups.
+inline bool HoldsBars(const T_SECT_D& s)
+{
+    if (!s.detailing || s.shape != SECT_SHAPE::Rectangle) return true;
+    const double edge = s.detailing->cover + s.detailing->stirrupDiameter;
+    return std::ranges::all_of(s.bars, [&](const T_REBAR& bar) {
+        return std::fabs(bar.z) < 0.5 * s.size[0] - edge &&
+               std::fabs(bar.y) < 0.5 * s.size[1] - edge;
+    });
+}
 
 // ---- elements and constraints -------------------------------------------------------------------
 
