@@ -11,6 +11,8 @@
 #include "qm_rps/push/stopwarnings.h"
 #include "qm_rps/pushoverhingelistdlg.h"
 
+#include <algorithm>
+
 namespace {
 
 // In the order of SKEL_TYPE.
@@ -186,6 +188,7 @@ EXIT_CODE RunCaseCheck(const std::string& file)
         findings += all.size();
     };
     print(Say("IDS_QM_UI_POGC_TITLE"), PushControlFindings(model.pushControl, model));
+    print(Say("IDS_QM_UI_TABLE_STOREYS"), StoreyFindings(model));
     for (const auto& [key, function] : model.incrementFunctions)
         print(Say("IDS_QM_CASE_FUNCTION", function.name), IncrementFunctionFindings(function));
     for (const auto& entry : model.pushovers) {
@@ -198,7 +201,13 @@ EXIT_CODE RunCaseCheck(const std::string& file)
             ++warnings;
         }
     }
-    for (const std::string& warning : PushWarnings(doc)) {
+    std::vector<std::string> general = PushWarnings(doc);
+    // Without control data the curve is another program's.
+    const bool pushes = std::ranges::any_of(
+        model.pushovers, [](const auto& entry) { return entry.second.control.has_value(); });
+    const std::string elastic = NoHingeText(model);
+    if (pushes && !elastic.empty()) general.insert(general.begin(), elastic);
+    for (const std::string& warning : general) {
         PrintLine(warning);
         ++warnings;
     }

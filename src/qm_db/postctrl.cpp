@@ -1,6 +1,7 @@
 #include "qm_db/postctrl.h"
 
 #include "qm_db/records/evalnames.h"
+#include "qm_db/records/storeyrules.h"
 #include "qm_db/storyload.h"
 
 #include <algorithm>
@@ -279,6 +280,7 @@ double CPostCtrl::MassAlong(const T_NODE_D& node) const
 int CPostCtrl::ReadLevels()
 {
     if (!m_levels.empty()) return 1;
+    if (!StoreyFindings(m_data.Model()).empty()) return 0; // drifts between the wrong levels
     double height = 0.0;
     for (const auto& [key, storey] : m_data.Model().storeys) {
         height += FromSi(storey.height, m_data.Units(), kDimLength);

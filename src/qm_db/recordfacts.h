@@ -7,4 +7,5 @@
 #include "qm_db/records/loadcaserules.h"
 #include "qm_db/records/pushcontrol.h"
 #include "qm_db/records/pushnames.h"
+#include "qm_db/records/storeyrules.h"
 #include "qm_db/records/structnames.h"

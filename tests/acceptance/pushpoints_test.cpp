@@ -141,6 +141,7 @@ TEST_F(PushPoints, ArePicturesOfTheFrameAndItsStoreys)
     EXPECT_EQ(2, beyond.code);
     ExpectHolds(beyond.err, {"no step 9999", "20"});
     ExpectRefused("push c.json --overwrite --plot-hinges h.svg --at nobody", 2, "nobody");
+    ExpectRefused("push c.json --overwrite --plot-hinges h.svg --at E --state XX", 2, "XX");
     ExpectRefused("push c.json --step 2", 2, "--plot-hinges");
 }
 

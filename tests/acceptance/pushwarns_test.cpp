@@ -48,6 +48,35 @@ TEST_F(PushWarns, RefusesLoadsThatDoNotPush)
     EXPECT_EQ("reached", Json("push c.json")[0].at("status"));
 }
 
+TEST_F(PushWarns, SaysThatAPushIsElastic)
+{
+    const json file = Data("pc_two_storey");
+    json left = file, none = file;
+    left["hinge_types"].push_back(file["hinge_types"][0]);
+    left["hinge_types"].back()["name"] = "spare";
+    left["pushover_control"]["hinge_types"] = {"spare"};
+    none.erase("hinges");
+    for (const auto& [model, text] :
+         {std::pair{left, "No hinge acts: the push is elastic"},
+          std::pair{none, "The model has no hinges: the push is elastic"}}) {
+        Write("c.json", model.dump(1));
+        for (const char* const command : {"push c.json", "case check c.json"})
+            ExpectHolds(Done(command), {text});
+        ExpectHolds(Json("push c.json")[0].at("warnings").at(0), {text});
+    }
+}
+
+TEST_F(PushWarns, RefusesStoreysFromTopToBottom)
+{
+    json file = Data("pc_two_storey");
+    std::swap(file["storeys"][0], file["storeys"][1]);
+    const char* const text = "\"S1\" stands lower than \"S2\"";
+    ExpectHolds(Refused(file), {text});
+    const T_RUN check = Run("case check c.json");
+    EXPECT_EQ(1, check.code);
+    ExpectHolds(check.out, {text, "1 findings"});
+}
+
 TEST_F(PushWarns, SaysWhichStopsCantAct)
 {
     json file = Data("pc_two_storey"); // without acceptance criteria

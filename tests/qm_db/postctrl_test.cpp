@@ -1,4 +1,5 @@
 #include "qm_db/dbdoc.h"
+#include "qm_db/recordfacts.h"
 #include "qm_db/storyload.h"
 
 #include <gtest/gtest.h>
@@ -82,6 +83,17 @@ TEST(PostCtrl, StoreyDriftIsByNodePairsAndByCentreOfMass)
     expect(1, 1, 1, 0.007, 0.005);
     c.model.nodes[21].xyz[0] = 2.5; // no node below it: against the mean 0.016 of the storey below
     expect(1, 1, 1, 0.006, 0.005);
+
+    // Listed from top to bottom, drifts would be between the wrong levels.
+    T_MODEL_CONTENT falls = c;
+    for (auto& [id, node] : falls.model.nodes)
+        node.xyz[2] = id / 10 == 2 ? 3.0 : 7.0;
+    std::swap(c, falls);
+    expect(0, 1, 1, -1.0, -1.0);
+    EXPECT_EQ(1U, StoreyFindings(c.model).size());
+    c.model.styp.plane = MODEL_PLANE::XY; // Z says nothing of the height
+    expect(1, 1, 1, 0.006, 0.005);
+    std::swap(c, falls);
 
     // A storey without results is not one that stands still: the drift is that of the next known
     // level over the height between.

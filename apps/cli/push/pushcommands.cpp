@@ -7,6 +7,7 @@
 #include "qm_base/say.h"
 #include "qm_rps/desk/elementlist.h"
 #include "qm_rps/push/pushresultlist.h"
+#include "qm_rps/pushover/pushovertargetevaluation.h"
 #include "json/pushjson.h"
 
 #ifdef QM_UI
@@ -54,6 +55,14 @@ EXIT_CODE ReadNodes(CDBDoc& doc, const T_PUSH_OPTIONS& o, std::set<int>& out)
     return EXIT_CODE::Done;
 }
 
+bool IsLimitState(const std::string& name)
+{
+    for (const PUSH_METHOD method : {PUSH_METHOD::Ntc2008, PUSH_METHOD::Ec8Opcm})
+        for (const T_LIMIT_ROW& row : CPushOverTargetEvaluation::EmptyRows(method))
+            if (row.name == name) return true;
+    return false;
+}
+
 /// What chooses a step needs a picture of one; a step is chosen in one way.
 EXIT_CODE CheckStepOptions(const T_PUSH_OPTIONS& o)
 {
@@ -66,6 +75,8 @@ EXIT_CODE CheckStepOptions(const T_PUSH_OPTIONS& o)
         return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_SETUP_BOTH", "--of", "--at"));
     if (!o.state.empty() && o.at.empty())
         return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_PUSH_STATE_ALONE"));
+    if (!o.state.empty() && !IsLimitState(o.state))
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_PUSH_UNKNOWN_STATE", o.state));
     return EXIT_CODE::Done;
 }
 

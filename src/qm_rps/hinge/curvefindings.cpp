@@ -183,6 +183,21 @@ void CurveFindings(const T_SKEL_CURVE& curve, SKEL_TYPE type, const T_HINGE_PLAC
         CurveFindings(std::get<T_SKEL_EC8>(curve), place, out);
 }
 
+void PushFindings(const T_SKEL_CURVE& curve, SKEL_TYPE type, const T_HINGE_PLACE& place,
+                  T_FINDINGS& out)
+{
+    if (const auto* m = std::get_if<T_SKEL_MULTI>(&curve)) {
+        RatioFindings(*m, type, place, out);
+    } else if (const auto* f = std::get_if<T_SKEL_FEMA>(&curve)) {
+        ForEachForce(*f, place, [&](const T_SIDES<T_SKEL_SIDE>& sides, const T_HINGE_PLACE& at) {
+            CheckAcceptance(CheckedSides(*f, sides), at, out);
+        });
+    } else {
+        const auto& e = std::get<T_SKEL_EC8>(curve);
+        CheckAcceptance(CheckedSides(e, e.sides), place, out);
+    }
+}
+
 std::vector<T_FINDING> ComponentFindings(HINGE_COMPONENT c, const T_HINGE_COMPONENT& component)
 {
     T_FINDINGS out;

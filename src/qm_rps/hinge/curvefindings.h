@@ -16,6 +16,13 @@ void CurveFindings(const T_SKEL_CURVE& curve, SKEL_TYPE type, const T_HINGE_PLAC
 /// Those of each page of a component; none where it is not active.
 std::vector<T_FINDING> ComponentFindings(HINGE_COMPONENT c, const T_HINGE_COMPONENT& component);
 
+/// Those without which a push of the curve means nothing: signs of stiffness reduction ratios,
+/// order of acceptance criteria. Appends.
+void RatioFindings(const T_SKEL_MULTI& curve, SKEL_TYPE type, const T_HINGE_PLACE& place,
+                   std::vector<T_FINDING>& out);
+void PushFindings(const T_SKEL_CURVE& curve, SKEL_TYPE type, const T_HINGE_PLACE& place,
+                  std::vector<T_FINDING>& out);
+
 /// The older table of a FEMA curve's diagram (signs, deformations A <= B <= C <= D <= E,
 /// strengths), then its acceptance criteria; one message key for each of the two tables.
 std::vector<T_FINDING> DiagramFindings(const T_SKEL_FEMA& curve, HINGE_COMPONENT c);

@@ -202,6 +202,13 @@ void CurveFindings(const T_SKEL_MULTI& curve, SKEL_TYPE type, const T_HINGE_PLAC
     WalkRulesBySide(kStiffness, sides, place, out);
 }
 
+void RatioFindings(const T_SKEL_MULTI& curve, SKEL_TYPE type, const T_HINGE_PLACE& place,
+                   std::vector<T_FINDING>& out)
+{
+    const std::vector<S> both = BothSides(curve, type);
+    WalkRulesBySide(kRatios, Entered(both), place, out);
+}
+
 void RatioWarnings(const T_SKEL_MULTI& curve, SKEL_TYPE type, const T_HINGE_PLACE& place,
                    std::vector<T_FINDING>& out)
 {

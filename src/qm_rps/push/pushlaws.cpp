@@ -1,6 +1,7 @@
 #include "qm_rps/push/pushlaws.h"
 
 #include "qm_base/say.h"
+#include "qm_rps/hinge/curvefindings.h"
 #include "qm_rps/hinge/hingechoices.h"
 #include "qm_rps/hinge/hingegenerator.h"
 #include "qm_rps/hinge/hingetable.h"
@@ -183,6 +184,12 @@ private:
     {
         const T_HINGE_COMPONENT& component = At(page.type, page.component);
         const T_SKEL_CURVE& curve = spot.pageJ ? component.curves.J : component.curves.I;
+        std::vector<T_FINDING> wrong;
+        PushFindings(curve, component.type, {static_cast<int>(page.component)}, wrong);
+        for (const T_FINDING& f : wrong) {
+            reason = f.field + ": " + f.text;
+            return 0;
+        }
         T_LAW_BASIS basis;
         basis.length = spot.length;
         if (m_options.axial && component.type == SKEL_TYPE::Fema)

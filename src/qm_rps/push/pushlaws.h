@@ -35,7 +35,8 @@ struct T_PUSH_LAW_OPTIONS {
 /// global axes. elements: ids by the engine's index, ascending.
 /// 1 done; 0 with what is wrong, naming element, type and component; `out` unchanged. Refused:
 /// stale or missing strengths, a kind of element or a component that does not fit, a released end,
-/// two hinges of a component at one place, and what MakeLaw refuses.
+/// two hinges of a component at one place, ratios below 0, acceptance criteria out of order
+/// (PushFindings), and what MakeLaw refuses.
 [[nodiscard]] int BuildPushHinges(CDBDoc& doc, std::span<const int> elements,
                                   const T_PUSH_LAW_OPTIONS& options, T_PUSH_HINGES& out,
                                   std::string& error);

@@ -25,6 +25,16 @@ double LargestOf(const std::vector<T_VEC3>& forces)
     return most;
 }
 
+/// Of the moments at nodes, summed.
+double LargestMoment(const solver::T_LOAD_CASE& loads, std::size_t nodes)
+{
+    std::vector<T_VEC3> sums(nodes);
+    for (const auto& l : loads.nodal)
+        for (std::size_t d = 0; d < 3; ++d)
+            sums[l.node][d] += l.load[d + 3];
+    return LargestOf(sums);
+}
+
 bool HasStrain(const solver::T_LOAD_CASE& loads)
 {
     return !loads.settlement.empty() || !loads.temperature.empty() || !loads.pretension.empty();
@@ -58,7 +68,8 @@ public:
             done = row.kind == 1 ? Acceleration(row, one, error) : Mode(row, one, error);
         }
         if (!done) return 0;
-        if (!HasLoad(one, m_frame.Frame())) return Fail(error, Say("IDS_QM_PUSH_PATTERN_EMPTY"));
+        if (row.factor == 0.0 || !HasLoad(one, m_frame.Frame()))
+            return Fail(error, Say("IDS_QM_PUSH_PATTERN_EMPTY"));
         AddLoads(to, one, row.factor);
         largest =
             std::max(largest, std::fabs(row.factor) * LargestOf(NodeForces(one, m_frame.Frame())));
@@ -201,7 +212,9 @@ int BuildPattern(const T_MODEL& model, const CAnalysisModel& frame, const T_POLC
             return Fail(error, Say("IDS_QM_PUSH_PATTERN_ROW", std::to_string(i + 1), why));
     }
     const double left = LargestOf(NodeForces(loads, frame.Frame()));
-    if (largest > 0.0 && left <= kRounding * largest && !HasStrain(loads))
+    const bool turns =
+        !loads.beam.empty() || LargestMoment(loads, frame.Frame().nodes.size()) > 0.0;
+    if (left <= kRounding * largest && (largest > 0.0 || !turns) && !HasStrain(loads))
         return Fail(error, Say("IDS_QM_PUSH_PATTERN_CANCELS"));
     if (record.eccentricity != 0.0 && !AddEccentricity(model, frame, record, loads, error))
         return 0;

@@ -1,8 +1,10 @@
 #include "qm_rps/push/pushrun.h"
 
 #include "qm_base/say.h"
+#include "qm_db/recordfacts.h"
 #include "qm_rps/push/loadalgebra.h"
 #include "qm_rps/push/pushcollector.h"
+#include "qm_rps/push/pushwarnings.h"
 #include "qm_rps/push/stopwarnings.h"
 #include "qm_solver/framesolver.h"
 
@@ -47,6 +49,10 @@ int CPushRun::AxialOf(const solver::T_LOAD_CASE& initial, T_PREPARED& to, std::s
 int CPushRun::PrepareNew(const T_PUSH_BASIS& basis, T_PREPARED& to, std::string& error)
 {
     to.basis = basis;
+    for (const T_FINDING& wrong : StoreyFindings(m_model)) {
+        error = wrong.text;
+        return 0;
+    }
     solver::T_PUSH_MODEL model;
     if (!BuildInitialLoads(m_frame, basis.initialLoads, model.initial, error)) return 0;
     const T_POGC_D& control = m_model.pushControl;
@@ -201,6 +207,7 @@ int CPushRun::Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_
     if (!PrepareCases(key, cases, on, error)) return 0;
     const auto warnings = StopWarnings(m_model.pushovers.at(key).stops,
                                        !StoreysOf(m_model, m_frame, 0).empty(), on->hinges.laws);
+    const std::string elastic = NoHingeText(m_model);
     std::vector<T_PUSH_RUN> runs;
     for (T_PUSH_CASE& c : cases) {
         std::vector<double>& steps = c.stages.back().additional;
@@ -210,6 +217,7 @@ int CPushRun::Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_
             error = Say("IDS_QM_PUSH_CASE_QUOTED", m_model.pushovers.at(key).name) + ": " + error;
             return 0;
         }
+        if (!elastic.empty()) runs.back().warnings.push_back(elastic);
         for (const T_FINDING& warning : warnings)
             runs.back().warnings.push_back(warning.field + ": " + warning.text);
         if (runs.back().cancelled) break;

@@ -6,6 +6,9 @@
 #include <string>
 #include <vector>
 
+/// That a push of the model is elastic: it has no hinges, or none of them acts. Empty: some act.
+std::string NoHingeText(const T_MODEL& model);
+
 /// Entered values that another entered one makes void, of the hinge types that stand on elements
 /// and act, a line each. None of them keeps the push from running.
 std::vector<std::string> PushWarnings(CDBDoc& doc);

@@ -173,6 +173,17 @@ TEST(PushLaws, RefuseWhatDoesNotFitNamingElementTypeAndComponent)
     T_ELEM_D beam{1, 1, 2, 1, 1}, released = beam, bar = beam;
     released.release.J[4] = true;
     bar.kind = ELEM_KIND::Truss;
+    T_SKEL_MULTI softens = Flat(300, 200), trilinear = Flat(300, 200);
+    softens.sides.neg.alpha1 = -0.5;
+    for (T_SKEL_MULTI_SIDE* side : {&trilinear.sides.pos, &trilinear.sides.neg})
+        side->P2 = 400, side->alpha1 = 0.3, side->alpha2 = -0.1;
+    T_SKEL_FEMA disordered;
+    disordered.autoYield = false;
+    disordered.sides.pos.IO = 6, disordered.sides.pos.LS = 4, disordered.sides.pos.CP = 7;
+    T_SKEL_FEMA byAxial; // in the curve of one axial force only
+    byAxial.autoYield = false, byAxial.multiCurve = true;
+    byAxial.curves.resize(2);
+    byAxial.curves[1].axial = 1, byAxial.curves[1].sides.pos.LS = 2;
     const struct {
         T_PHGT_D type;
         std::vector<T_PHGE_D> hinges;
@@ -185,6 +196,14 @@ TEST(PushLaws, RefuseWhatDoesNotFitNamingElementTypeAndComponent)
         {truss, {Hinge()}, bar, "does not have this component"},
         {shear, {Hinge()}, beam, "Vy-Vz"},
         {Type({My}, Flat(300, 0)), {Hinge()}, beam, "the strength of the side (-)"},
+        {Type({My}, softens), {Hinge()}, beam, "My I: sides.neg.alpha1: "},
+        {Type({My}, trilinear, SKEL_TYPE::Trilinear), {Hinge()}, beam, "sides.pos.alpha2: "},
+        {Type({My}, disordered, SKEL_TYPE::Fema),
+         {Hinge()},
+         beam,
+         "My I: sides.pos.LS: Hinge properties of component My are wrong. This rule is not kept: "
+         "IO <= LS."},
+        {Type({My}, byAxial, SKEL_TYPE::Fema), {Hinge()}, beam, "curves[1].sides.pos.CP: "},
     };
     for (const auto& c : cases) {
         std::string error;

@@ -26,6 +26,7 @@ T_MODEL Tower()
     m.loadCases[1].name = "W";
     m.loadCases[1].nodal = {{3, {7, 0, 0, 0, 0, 0}}};
     m.loadCases[2].name = "nothing";
+    m.loadCases[3].nodal = {{3, {0, 0, 0, 0, 4, 0}}};
     return m;
 }
 
@@ -110,6 +111,8 @@ TEST(PushPatterns, RefusesWhatHoldsNoForce)
     } cases[] = {
         {Tower(), Case({}), "no load pattern"},
         {Tower(), Case({{0, 1, 1}, {0, 2, 1}}), "Row 2 of the load pattern: there is no force"},
+        {Tower(), Case({{0, 1, 1}, {1, 1, 0}}), "Row 2 of the load pattern: there is no force"},
+        {Tower(), Case({{0, 3, 1}, {0, 3, -1}}), "cancel each other"}, // moments
         {Tower(), Case({{0, 9, 1}}), "Row 1"},
         {Tower(), Case({{2, 4, 1}}), "no mode 4"},
         {massless, Case({{1, 1, 1}}), "no mass"},

@@ -49,7 +49,9 @@ std::optional<double> CStepDrift::Of(int step)
 
 const char* CStepDrift::WarningKey()
 {
-    if (m_missing) return "IDS_QM_WARN_NO_DRIFT";
+    if (m_missing)
+        return StoreyFindings(m_doc.Data().Model()).empty() ? "IDS_QM_WARN_NO_DRIFT"
+                                                            : "IDS_QM_WARN_STOREY_ORDER";
     return m_used && m_doc.Post().HasStoreyGaps(m_push.key, m_push.turn) ? "IDS_QM_WARN_STOREY_GAPS"
                                                                          : nullptr;
 }
