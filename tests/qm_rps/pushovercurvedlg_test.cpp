@@ -236,6 +236,14 @@ TEST(PushOverCurveDlg, WarnsAndGoesOn)
     EXPECT_TRUE(run.Said("IDS_QM_WARN_NO_DRIFT"));
     EXPECT_EQ("not checked", run.R().limitStates[1].remark);
 
+    c = Plastic(); // listed from top to bottom
+    for (const auto& [key, storey] : c.model.storeys)
+        for (const int id : storey.nodes)
+            c.model.nodes[id].xyz[2] = -key;
+    T_RUN falls(c, Eval(PUSH_METHOD::Ntc2008));
+    EXPECT_TRUE(falls.Said("IDS_QM_WARN_STOREY_ORDER"));
+    EXPECT_EQ("not checked", falls.R().limitStates[1].remark);
+
     c = Plastic();
     c.model.nodes[1].mass[0] = 0.0;
     T_EVAL_D eval = Eval(PUSH_METHOD::Ec8Opcm);
