@@ -28,13 +28,13 @@ inline T_MODEL_CONTENT ThreeMasses(const std::vector<double>& D, const std::vect
     m.styp.gravity = 10.0;
     for (int i = 1; i <= 3; ++i) {
         const double mass = i < 3 ? 2000.0 : 1000.0;
-        m.nodes[i] = {i, {0, 0, -3.0 * i}, {mass, 500, mass}, {}};
+        m.nodes[i] = {i, {0, 0, 3.0 * i}, {mass, 500, mass}, {}};
         m.storeys[i] = {std::to_string(i) + "F", 3.0, {i}};
         m.modes[1].shape[i] = {0, 1.0 * i};
         m.modes[2].shape[i] = {1.0 * i};
     }
-    m.nodes[4] = {4, {5, 0, -6}, {7000, 0, 0}, {1, 0, 0, 0, 0, 0}};
-    m.nodes[5] = {5, {9, 0, -6}, {50000, 50000, 50000}, {}};
+    m.nodes[4] = {4, {5, 0, 6}, {7000, 0, 0}, {1, 0, 0, 0, 0, 0}};
+    m.nodes[5] = {5, {9, 0, 6}, {50000, 50000, 50000}, {}};
     m.storeys[2].nodes.push_back(4);
     m.modes[2].shape[4] = m.modes[2].shape[5] = {5};
     m.modes[3] = m.modes[2];
