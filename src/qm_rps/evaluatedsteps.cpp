@@ -15,8 +15,13 @@ namespace {
 struct T_WAY {
     double start = 0.0; // before the first step
     double sign = 1.0;  // where the control node has gone, however it is controlled
+    double reach = 0.0; // furthest displacement of the stored push, a magnitude
 
     double At(double magnitude) const { return start + sign * std::fabs(magnitude); }
+    bool Reaches(double displacement) const
+    {
+        return std::fabs(displacement - start) <= reach * (1.0 + kSameDisplacement);
+    }
 };
 
 T_WAY WayOf(IPushRun& run, int controlNode)
@@ -33,6 +38,7 @@ T_WAY WayOf(IPushRun& run, int controlNode)
     const double furthest =
         *std::ranges::max_element(moved, {}, [](double u) { return std::fabs(u); });
     way.sign = furthest < 0.0 ? -1.0 : 1.0;
+    way.reach = std::fabs(furthest);
     return way;
 }
 
@@ -69,21 +75,38 @@ bool IsStep(std::span<const T_PUSH_RUN> runs, double displacement)
         runs, [&](const T_PUSH_RUN& run) { return std::ranges::any_of(run.displacement, same); });
 }
 
-/// Displacements that the engine can be asked for.
-std::vector<double> StepsAt(const T_POLC_D& record, const std::vector<T_PUSH_POINT>& points)
-{
-    std::vector<double> out;
-    for (const T_PUSH_POINT& point : points)
-        if (IsOnTheWay(record, point.displacement)) out.push_back(point.displacement);
-    return out;
-}
-
 /// What is wanted of the results of one load case.
 struct T_WANTED {
     T_HINGES_AT* to = nullptr;
     int turn = 0;
     std::vector<T_PUSH_POINT> points;
+    T_WAY way;
 };
+
+/// Displacements that the engine can be asked for, no further than the stored pushes have come.
+std::vector<double> StepsAt(const T_POLC_D& record, const std::vector<T_WANTED>& wanted)
+{
+    std::vector<double> out;
+    for (const T_WANTED& one : wanted)
+        for (const T_PUSH_POINT& point : one.points)
+            if (one.way.Reaches(point.displacement) && IsOnTheWay(record, point.displacement))
+                out.push_back(point.displacement);
+    return out;
+}
+
+/// A push that was cancelled comes further when it is pushed again: what the stored one has not
+/// reached stays without values.
+std::vector<T_PUSH_AT_POINT> PointsAsStored(const T_PUSH_RUN& run, const T_WANTED& wanted)
+{
+    std::vector<T_PUSH_AT_POINT> out = PushAtPoints(run, wanted.points);
+    for (T_PUSH_AT_POINT& at : out)
+        if (!wanted.way.Reaches(at.point.displacement)) {
+            const T_PUSH_POINT point = at.point;
+            at = {};
+            at.point = point;
+        }
+    return out;
+}
 
 /// The points of an evaluation on a push of our own that is not older than the model, and the key
 /// of its load case; without such a push `to` stays empty, a note says why there are no points.
@@ -104,7 +127,8 @@ T_WANTED WantedOf(CDBDoc& doc, const T_PUSH_EVALUATION& e, int& key, T_HINGES_AT
                       std::to_string(controlNode));
         return {};
     }
-    return {&to, push->turn, PointsOf(e, WayOf(*run, controlNode))};
+    const T_WAY way = WayOf(*run, controlNode);
+    return {&to, push->turn, PointsOf(e, way), way};
 }
 
 /// Pushes a load case to the points of its evaluations, and shares these out. The run of the first
@@ -112,19 +136,16 @@ T_WANTED WantedOf(CDBDoc& doc, const T_PUSH_EVALUATION& e, int& key, T_HINGES_AT
 T_PUSH_RUN PushToPoints(CPushRun& push, int key, const T_POLC_D& record,
                         const std::vector<T_WANTED>& wanted, const PUSH_PROGRESS_FN& progress)
 {
-    std::vector<T_PUSH_POINT> all;
-    for (const T_WANTED& one : wanted)
-        all.insert(all.end(), one.points.begin(), one.points.end());
     std::vector<T_PUSH_RUN> runs;
     std::string note = WhyNotPushed(record), error;
-    if (note.empty() && !push.Run(key, progress, runs, error, StepsAt(record, all)))
+    if (note.empty() && !push.Run(key, progress, runs, error, StepsAt(record, wanted)))
         note = error;
     else if (note.empty() && runs.back().cancelled)
         note = Say("IDS_QM_PUSH_AT_INTERRUPTED");
     for (const T_WANTED& one : wanted) {
         one.to->note = note;
         const auto run = std::ranges::find(runs, one.turn, &T_PUSH_RUN::turn);
-        if (note.empty() && run != runs.end()) one.to->points = PushAtPoints(*run, one.points);
+        if (note.empty() && run != runs.end()) one.to->points = PointsAsStored(*run, one);
     }
     const auto first = std::ranges::find(runs, wanted.front().turn, &T_PUSH_RUN::turn);
     return note.empty() && first != runs.end() ? std::move(*first) : T_PUSH_RUN();

@@ -229,6 +229,38 @@ TEST_F(PushWindows, TheHingesAtAPerformancePointAreOneClickFromTheEvaluation)
     EXPECT_EQ(run.displacement, Stored("PX TRIANGLE").displacement) << "the results stay";
 }
 
+TEST_F(PushWindows, PointsBeyondACancelledPushAreWithoutValues)
+{
+    ASSERT_TRUE(Open("masonry-wall"));
+    CDBDoc& doc = m_main->Doc();
+    int key = 0;
+    ASSERT_TRUE(doc.Attr().FindPolc("PX TRIANGLE", key));
+    const double target = Model().pushovers.at(key).control->masterMaxDispl;
+    CPushRun push(doc);
+    std::vector<T_PUSH_RUN> runs;
+    std::string error;
+    // Steps of 1 mm: cancelled after the fifth, between the demands of SLD and SLV.
+    const auto goOn = [](const T_PUSH_PROGRESS& p) { return p.displacement < 0.0045; };
+    ASSERT_TRUE(push.Run(key, goOn, runs, error)) << error;
+    ASSERT_TRUE(runs.back().cancelled);
+    const double end = runs.back().displacement.back();
+    push.Keep(runs);
+    T_PUSH_EVALUATION found;
+    ASSERT_TRUE(EvaluateStored(doc, "PX TRIANGLE NTC2018", found, error)) << error;
+    const std::vector<T_HINGES_AT> all = HingesOfEvaluations(doc, {&found, 1}, {});
+    std::size_t reached = 0, beyond = 0;
+    for (const T_PUSH_AT_POINT& at : all.at(0).points) {
+        const double d = at.point.displacement;
+        const bool isStored = d <= end + 1e-9;
+        EXPECT_EQ(isStored, at.found == AT_POINT::Reached) << d << ", end " << end;
+        EXPECT_EQ(isStored, !at.storeys.empty()) << d;
+        reached += isStored ? 1 : 0;
+        beyond += !isStored && d <= target ? 1 : 0; // a whole push would have come there
+    }
+    EXPECT_GT(reached, 0U);
+    EXPECT_GT(beyond, 0U);
+}
+
 TEST_F(PushWindows, AtOnceTheModelIsPushedAndItsHingesShown)
 {
     CPlay play({{kStates,
