@@ -131,26 +131,40 @@ std::string CPushOverResultDlg::PointText() const
 {
     const int point = PointIndex();
     if (point < 0) return {};
-    return PointName(m_points.points[static_cast<std::size_t>(point)].point) + ", " +
-           m_points.evaluation;
+    return Say("IDS_QM_PLOT_PUSH_POINT_OF",
+               PointName(m_points.points[static_cast<std::size_t>(point)].point),
+               m_points.evaluation);
+}
+
+std::string CPushOverResultDlg::MarkName() const
+{
+    if (!ShowsPoints() || m_step < 1) return Say("IDS_QM_PLOT_PUSH_STEP", std::to_string(m_step));
+    return Say("IDS_QM_PLOT_PUSH_AT", DisplacementText());
 }
 
 std::string CPushOverResultDlg::StepName() const
 {
     const std::string point = PointText();
-    return Say("IDS_QM_PLOT_PUSH_STEP", std::to_string(m_step)) +
-           (point.empty() ? "" : " (" + point + ")");
+    return MarkName() + (point.empty() ? "" : " (" + point + ")");
+}
+
+std::string CPushOverResultDlg::DisplacementText() const
+{
+    const T_PUSH_QUANTITY displacement = DisplacementIn(m_run.direction, Units());
+    return FormatText("%.5g", displacement.Shown(
+                                  m_run.displacement[static_cast<std::size_t>(m_step - 1)])) +
+           " " + displacement.Unit();
 }
 
 std::string CPushOverResultDlg::StepText() const
 {
     if (m_step < 1) return {};
     const auto i = static_cast<std::size_t>(m_step - 1);
-    const T_PUSH_QUANTITY displacement = DisplacementIn(m_run.direction, Units());
     const T_PUSH_QUANTITY reaction = ReactionIn(m_run.direction, Units());
-    return Say("IDS_QM_UI_PUSH_STEP_OF", StepName(), std::to_string(Steps()),
-               FormatText("%.5g", m_run.loadFactor[i]),
-               FormatText("%.5g", displacement.Shown(m_run.displacement[i])) + " " +
-                   displacement.Unit(),
-               FormatText("%.5g", reaction.Shown(m_run.baseReaction[i])) + " " + reaction.Unit());
+    const std::string factor = FormatText("%.5g", m_run.loadFactor[i]);
+    const std::string base =
+        FormatText("%.5g", reaction.Shown(m_run.baseReaction[i])) + " " + reaction.Unit();
+    if (ShowsPoints()) return Say("IDS_QM_UI_PUSH_STEP_AT", StepName(), factor, base);
+    return Say("IDS_QM_UI_PUSH_STEP_OF", StepName(), std::to_string(Steps()), factor,
+               DisplacementText(), base);
 }

@@ -41,9 +41,12 @@ public:
     int Step() const { return m_step; } // from 1; 0: there is none
     /// Beyond the ends: the nearest one.
     void OnStep(int step);
-    /// "performance point, PX ATC": what the step is; empty: no point.
+    /// "performance point of PX ATC": what the step is; empty: no point.
     std::string PointText() const;
-    /// "Step 12", at a point "Step 12 (performance point, PX ATC)".
+    /// "Step 12"; of a push to points, whose steps have other numbers than the stored ones, "at
+    /// 0.1338 m".
+    std::string MarkName() const;
+    /// "Step 12", at a point "at 0.1338 m (performance point of PX ATC)".
     std::string StepName() const;
     /// Load factor, displacement and base reaction of the step.
     std::string StepText() const;
@@ -59,6 +62,7 @@ protected:
 
 private:
     const T_PUSH_AT_POINT& FirstPoint() const;
+    std::string DisplacementText() const;
     bool ShowsPoints() const { return m_index == std::ssize(m_results); }
 
     std::vector<T_PUSH_RESULT_ID> m_results;

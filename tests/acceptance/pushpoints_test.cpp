@@ -122,8 +122,8 @@ TEST_F(PushPoints, ArePicturesOfTheFrameAndItsStoreys)
         const char* options;
         json at;
         const char* step;
-    } pictures[] = {{"--at A", all[0]["hinges_at"][0], "(performance point, A)"},
-                    {"--at E --state SD", demand, "(SD: demand, E)"}};
+    } pictures[] = {{"--at A", all[0]["hinges_at"][0], "(performance point of A)"},
+                    {"--at E --state SD", demand, "(SD: demand of E)"}};
     for (const auto& p : pictures) {
         Done("push c.json --overwrite --plot-hinges h.svg --plot-storeys s.svg " +
              std::string(p.options));

@@ -208,12 +208,16 @@ TEST_F(PushWindows, TheHingesAtAPerformancePointAreOneClickFromTheEvaluation)
             const int i = points->findText(QString::fromStdString(row.name + ": demand"));
             ASSERT_GE(i, 0) << row.name;
             ChooseIndex(points, i);
-            EXPECT_TRUE(Says(w, QString::fromStdString(row.name + ": demand, " + name)));
+            EXPECT_TRUE(Says(w, QString::fromStdString(row.name + ": demand of " + name)));
             const T_PLOT& plot = Picture(w);
             // An evaluation counts from the state before the push on.
             const double total = *row.demand + plot.series.front().x.front();
             EXPECT_NEAR(total, plot.series.back().x.front(), 1e-9);               // m
             EXPECT_NEAR(shearAt(total) / 1e3, plot.series.back().y.front(), 0.2); // kN
+            const QString at = QString::number(total, 'g', 5);
+            EXPECT_TRUE(Says(w, "at " + at + " m (" + points->currentText() + " of "));
+            EXPECT_EQ("at " + at.toStdString() + " m", plot.series.back().name);
+            EXPECT_FALSE(Says(w, "Step ")) << "the stored steps have other numbers";
         }
         Slide(w, 1);
         EXPECT_EQ(-1, points->currentIndex());

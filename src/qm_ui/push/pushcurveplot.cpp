@@ -190,7 +190,7 @@ T_PLOT StepCurvePlot(const CPushOverResultDlg& shown)
     const double x = DisplacementIn(run.direction, shown.Units()).Shown(run.displacement[i]);
     const double y = ReactionIn(run.direction, shown.Units()).Shown(run.baseReaction[i]);
     T_PLOT_SERIES at;
-    at.name = Say("IDS_QM_PLOT_PUSH_STEP", std::to_string(shown.Step()));
+    at.name = shown.MarkName();
     at.x = {x};
     at.y = {y};
     at.line = PLOT_LINE::None;

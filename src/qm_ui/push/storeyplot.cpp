@@ -69,7 +69,7 @@ T_PLOT StoreyPlot(const CPushOverStoreyDlg& shown, STOREY_VALUE value)
     const auto step = static_cast<std::size_t>(shown.Step() - 1);
     T_PLOT_SERIES now = OverHeight(storeys, value, shown.Units(),
                                    [step](const auto& values) { return values[step]; });
-    now.name = Say("IDS_QM_PLOT_PUSH_STEP", std::to_string(shown.Step()));
+    now.name = shown.MarkName();
     now.color = T_PLOT_COLOR{21, 78, 140};
     now.line = PLOT_LINE::Solid;
     now.width = 2.4;
