@@ -5,6 +5,8 @@
 #include "qm_rps/pushover/fema440coefficients.h"
 #include "qm_rps/pushover/report/pushovercells.h"
 
+#include <algorithm>
+
 namespace {
 
 std::string Number(const std::optional<double>& v)
@@ -51,16 +53,20 @@ std::string StateLines(const T_PUSH_EVALUATION& e)
     std::string text =
         "\n" + Say("IDS_QM_CLI_LIMIT_STATES", e.eval.name, NameOf(e.units.length)) + "\n";
     const std::string step = Say("IDS_QM_CLI_STEP");
-    text += FormatText("  %-6s %12s %6s %12s %6s  %s\n", Say("IDS_QM_CLI_STATE").c_str(),
-                       Say("IDS_QM_CLI_DEMAND").c_str(), step.c_str(),
-                       Say("IDS_QM_CLI_CAPACITY").c_str(), step.c_str(),
-                       Say("IDS_QM_CLI_REMARK").c_str());
+    // printf counts bytes, of which an accented letter has two.
+    const std::string capacity = Say("IDS_QM_CLI_CAPACITY");
+    const int more = static_cast<int>(std::ranges::count_if(
+        capacity, [](char c) { return (static_cast<unsigned char>(c) & 0xC0U) == 0x80U; }));
+    text += FormatText("  %-6s %12s %6s %*s %6s  %s\n", Say("IDS_QM_CLI_STATE").c_str(),
+                       Say("IDS_QM_CLI_DEMAND").c_str(), step.c_str(), 12 + more, capacity.c_str(),
+                       step.c_str(), Say("IDS_QM_CLI_REMARK").c_str());
     for (const T_LIMIT_ROW& r : e.limitStates) {
         const auto cell = [&](const std::string& value) { return e.elastic ? "-" : value; };
-        text += FormatText("  %-6s %12s %6s %12s %6s  %s\n", r.name.c_str(),
-                           cell(Number(r.demand)).c_str(), cell(Step(r.demandStep)).c_str(),
-                           e.elastic ? kElasticText : Number(r.capacity).c_str(),
-                           cell(Step(r.capacityStep)).c_str(), r.RemarkText().c_str());
+        text += FormatText(
+            "  %-6s %12s %6s %12s %6s  %s\n", r.name.c_str(), cell(Number(r.demand)).c_str(),
+            cell(Step(r.demandStep)).c_str(),
+            (e.elastic ? Say("IDS_QM_CLI_CAPACITY_ELASTIC") : Number(r.capacity)).c_str(),
+            cell(Step(r.capacityStep)).c_str(), r.RemarkText().c_str());
     }
     return text;
 }

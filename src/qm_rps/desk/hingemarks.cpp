@@ -1,7 +1,5 @@
 #include "qm_rps/desk/hingemarks.h"
 
-#include "qm_base/say.h"
-
 #include <algorithm>
 
 T_HINGE_MARKS PlaceHinges(const T_PUSH_RUN& run, const T_FRAME_SCENE& scene, const T_MODEL& model)
@@ -35,11 +33,4 @@ void ShowStates(const T_PUSH_RUN& run, int step, long chosen, T_HINGE_MARKS& mar
         marks.hinges[i].state = run.hinges[i].state.at(static_cast<std::size_t>(step - 1));
         marks.hinges[i].chosen = static_cast<long>(i) == chosen;
     }
-}
-
-std::string PushStateText(PUSH_STATE state)
-{
-    if (state == PUSH_STATE::Elastic) return Say("IDS_QM_UI_STATE_ELASTIC");
-    if (state == PUSH_STATE::Failed) return Say("IDS_QM_UI_STATE_FAILED");
-    return kPushStateNames[static_cast<std::size_t>(state)];
 }

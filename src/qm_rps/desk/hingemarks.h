@@ -24,5 +24,3 @@ struct T_HINGE_MARKS {
 T_HINGE_MARKS PlaceHinges(const T_PUSH_RUN& run, const T_FRAME_SCENE& scene, const T_MODEL& model);
 /// The states of a step, from 1.
 void ShowStates(const T_PUSH_RUN& run, int step, long chosen, T_HINGE_MARKS& marks);
-/// "elastic", "B-IO" ... "failed" in the user's language.
-std::string PushStateText(PUSH_STATE state);

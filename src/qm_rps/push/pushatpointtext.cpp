@@ -11,11 +11,6 @@ namespace {
 
 constexpr int kNameWidth = 20;
 
-const char* StateName(PUSH_STATE state)
-{
-    return kPushStateNames[static_cast<std::size_t>(state)];
-}
-
 /// Places and headings may hold letters of two bytes, which printf counts as two columns.
 std::string Padded(const std::string& text, int width)
 {
@@ -42,7 +37,7 @@ std::string WorstText(const T_PUSH_AT_POINT& at)
 {
     if (at.worst.empty()) return "-";
     const T_HINGE_AT_POINT& worst = at.worst.front();
-    return PlaceText(worst.place) + ", " + StateName(worst.state) + ", " + RatioText(worst);
+    return PlaceText(worst.place) + ", " + PushStateText(worst.state) + ", " + RatioText(worst);
 }
 
 std::string DriftText(const T_PUSH_AT_POINT& at)
@@ -72,8 +67,8 @@ std::string WorstLines(const T_PUSH_AT_POINT& at, const T_UNITS& units)
         text += "    " + Padded(PlaceText(h.place), 14) +
                 FormatText(" %14.6g %14.6g  %-8s %s\n",
                            DeformationOf(h.place.component, units).Shown(h.deformation),
-                           ForceOf(h.place.component, units).Shown(h.force), StateName(h.state),
-                           RatioText(h).c_str());
+                           ForceOf(h.place.component, units).Shown(h.force),
+                           PushStateText(h.state).c_str(), RatioText(h).c_str());
     return text;
 }
 
@@ -98,6 +93,13 @@ std::string Title(const T_HINGES_AT& h)
 }
 
 } // namespace
+
+std::string PushStateText(PUSH_STATE state)
+{
+    if (state == PUSH_STATE::Elastic) return Say("IDS_QM_UI_STATE_ELASTIC");
+    if (state == PUSH_STATE::Failed) return Say("IDS_QM_UI_STATE_FAILED");
+    return kPushStateNames[static_cast<std::size_t>(state)];
+}
 
 std::string PointName(const T_PUSH_POINT& point)
 {
@@ -128,7 +130,7 @@ std::string HingesAtTable(const T_HINGES_AT& h)
     std::string text = "\n" + Title(h) + "\n  " + Padded("", kNameWidth) +
                        FormatText(" %13s", Say("IDS_QM_CLI_PUSH_DISPLACEMENT").c_str());
     for (std::size_t s = 0; s < seen.size(); ++s)
-        if (seen[s]) text += FormatText(" %8s", kPushStateNames[s]);
+        if (seen[s]) text += FormatText(" %8s", PushStateText(static_cast<PUSH_STATE>(s)).c_str());
     text +=
         "  " + Padded(Say("IDS_QM_PUSH_AT_WORST"), 36) + "  " + Say("IDS_QM_PUSH_AT_DRIFT") + "\n";
     for (const T_PUSH_AT_POINT& at : h.points)

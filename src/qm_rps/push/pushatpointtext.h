@@ -3,6 +3,8 @@
 
 #include "qm_rps/push/pushatpoint.h"
 
+/// "elastic", "B-IO" ... "failed".
+std::string PushStateText(PUSH_STATE state);
 /// "performance point", "SD: demand".
 std::string PointName(const T_PUSH_POINT& point);
 /// Why a point has no values; empty: it has.

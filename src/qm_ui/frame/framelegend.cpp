@@ -2,6 +2,7 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/push/pushatpointtext.h"
 #include "qm_ui/form/localnumber.h"
 #include "qm_ui/plot/plot.h"
 

@@ -2,7 +2,7 @@
 
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
-#include "qm_rps/desk/hingemarks.h"
+#include "qm_rps/push/pushatpointtext.h"
 #include "qm_rps/push/pushquantity.h"
 
 #include <algorithm>
