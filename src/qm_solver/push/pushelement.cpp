@@ -45,6 +45,7 @@ CPushElement::CPushElement(const T_FRAME& frame, std::size_t element,
         m_beam.emplace(frame, m_element);
         m_stiffness = m_beam->Local();
         m_length = m_beam->Length();
+        MeasureArms(frame);
     } else {
         ElementStiffness(frame, m_element, {}, m_stiffness);
         if (m_element.kind == ELEMENT_KIND::Truss)
@@ -55,6 +56,16 @@ CPushElement::CPushElement(const T_FRAME& frame, std::size_t element,
     CondenseSprings();
     MakeInfluence();
     MakeBasic();
+}
+
+/// Rigid ends lengthen the chord: the axial force turns with them about the nodes.
+void CPushElement::MeasureArms(const T_FRAME& frame)
+{
+    const T_VEC3& i = frame.nodes[m_element.i].xyz;
+    const T_VEC3& j = frame.nodes[m_element.j].xyz;
+    for (std::size_t d = 0; d < 3; ++d)
+        m_direction[d] = (j[d] + m_element.offsetJ[d] - i[d] - m_element.offsetI[d]) / m_length;
+    m_arms = {Dot(m_element.offsetI, m_direction), -Dot(m_element.offsetJ, m_direction)};
 }
 
 /// Motion of the ends that strains the element as a unit jump at the place does. Told at the end
@@ -146,6 +157,12 @@ void CPushElement::Stiffness(double tension, T_MATRIX12& global) const
         local[6 + d][d] -= across;
     }
     m_beam->ToNodes(local, global);
+    for (std::size_t end = 0; end < 2; ++end)
+        for (std::size_t r = 0; r < 3; ++r)
+            for (std::size_t c = 0; c < 3; ++c)
+                global[6 * end + 3 + r][6 * end + 3 + c] +=
+                    tension * m_arms[end] *
+                    ((r == c ? 1.0 : 0.0) - m_direction[r] * m_direction[c]);
 }
 
 /// Between clamped ends the spring of a hinge deforms by what the loads do at its place.
@@ -198,7 +215,13 @@ T_VEC12 CPushElement::Across(const T_VEC12& displacement, double tension) const
             forces[d] = across * (ends[d] - ends[6 + d]);
             forces[6 + d] = -forces[d];
         }
-        return m_beam->AtNodes(forces);
+        forces = m_beam->AtNodes(forces);
+        for (const std::size_t turn : {3u, 9u}) { // of the arm at I, at J
+            const T_VEC3 rotation = Part(displacement, turn);
+            const T_VEC3 bent = Minus(rotation, Scaled(m_direction, Dot(rotation, m_direction)));
+            AddPart(forces, turn, Scaled(bent, tension * m_arms[turn / 6]));
+        }
+        return forces;
     }
     const T_VEC3 drift = Minus(Part(displacement, 0), Part(displacement, 6));
     const T_VEC3 sideways = Minus(drift, Scaled(m_direction, Dot(drift, m_direction)));

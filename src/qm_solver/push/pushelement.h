@@ -33,7 +33,8 @@ struct T_ELEMENT_LOADS {
 /// rotation across the hinge, the side towards J less that towards I, so that force times
 /// deformation is its work. Springs are condensed: with C the motion of the ends that stands for
 /// unit jumps, k' = k - k C (K0 + C' k C)^-1 C' k. P-Delta is the couple of the axial force and the
-/// drift of the chord, N / L across, which no plastic deformation changes.
+/// drift of the chord, N / L across, which no plastic deformation changes, and of its rigid ends, N
+/// times the turn of each.
 class CPushElement {
 public:
     CPushElement(const T_FRAME& frame, std::size_t element,
@@ -67,6 +68,7 @@ public:
     double Tension(const T_VEC12& loads) const;
 
 private:
+    void MeasureArms(const T_FRAME& frame);
     T_VEC12 Motion(const T_PLACED_COMPONENT& component) const;
     void CondenseSprings();
     void MakeInfluence();
@@ -79,7 +81,8 @@ private:
     T_ELEMENT m_element;
     std::vector<T_PLACED_COMPONENT> m_components;
     std::optional<CBeamElement> m_beam;
-    T_VEC3 m_direction{};
+    T_VEC3 m_direction{};           // of trusses and beams
+    std::array<double, 2> m_arms{}; // of beams: rigid ends at I and J, along the direction
     double m_length = 1.0;
     T_MATRIX12 m_stiffness{};      // of beams: local, over the ends; of others: global
     std::vector<T_VEC12> m_motion; // of the ends by a unit jump

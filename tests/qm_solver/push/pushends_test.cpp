@@ -64,6 +64,12 @@ std::vector<T_END_CASE> EndCases()
     Join(mast.model.frame, ELEMENT_KIND::Beam, 1, 2);
     mast.stage.control = PUSH_CONTROL::LargestTranslation;
     mast.stage.target = 5.0;
+    // 10 on the tip, whose upper 0.4 is rigid: about the base 2 P + 10 u = 100.
+    T_END_CASE& arm = add("rigid end with P-Delta", ideal, PUSH_OUTCOME::Reached, 35.0, 3.0);
+    arm.model.frame.elements[0].offsetJ = {0, 0, -0.4};
+    arm.model.pDelta = P_DELTA::Initial;
+    arm.model.initial = PushTo(1.0).loads;
+    arm.model.initial.nodal[0].load = {0, 0, -10, 0, 0, 0};
     T_END_CASE& elastic = add("no hinges, back", Column(), PUSH_OUTCOME::Reached, -3.75, -0.1);
     elastic.stage.target = -0.1;
     elastic.stage.steps = {0.5, 1.0};
