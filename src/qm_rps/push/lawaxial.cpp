@@ -100,6 +100,32 @@ int FromShape(const T_AXIAL_BASIS& b, const T_SIDES<T_LINE>& lines,
     return 1;
 }
 
+/// Near the axial strengths an unsymmetrical section bends about its centroid whatever it carries:
+/// there one of its strengths has the other sign. The lines end where it is 0; beyond, the run ends
+/// at the axial strength.
+void EndAtZero(std::vector<solver::T_AXIAL_STRENGTH>& rows)
+{
+    const auto least = [](const solver::T_AXIAL_STRENGTH& r) {
+        return std::min(r.positive, r.negative);
+    };
+    const auto end = [&](solver::T_AXIAL_STRENGTH& outer, const solver::T_AXIAL_STRENGTH& inner) {
+        double part = 1.0; // of the way out
+        for (const auto& [a, b] :
+             {std::pair{inner.positive, outer.positive}, std::pair{inner.negative, outer.negative}})
+            if (b < 0.0) part = std::min(part, a / (a - b));
+        const auto at = [part](double a, double b) { return std::max(0.0, a + part * (b - a)); };
+        outer = {inner.axial + part * (outer.axial - inner.axial),
+                 at(inner.positive, outer.positive), at(inner.negative, outer.negative)};
+    };
+    while (rows.size() > 2 && least(rows[0]) < 0.0 && least(rows[1]) <= 0.0)
+        rows.erase(rows.begin());
+    while (rows.size() > 2 && least(rows.back()) < 0.0 && least(rows[rows.size() - 2]) <= 0.0)
+        rows.pop_back();
+    if (rows.size() < 3) return;
+    if (least(rows[0]) < 0.0) end(rows[0], rows[1]);
+    if (least(rows.back()) < 0.0) end(rows.back(), rows[rows.size() - 2]);
+}
+
 int FromSection(const T_AXIAL_BASIS& b, std::vector<solver::T_AXIAL_STRENGTH>& out,
                 std::string& reason)
 {
@@ -115,7 +141,9 @@ int FromSection(const T_AXIAL_BASIS& b, std::vector<solver::T_AXIAL_STRENGTH>& o
         reason = Say("IDS_QM_PUSH_LAW_NO_PM");
         return 0;
     }
-    return FromShape(b, SectionLines(b.component, sides, pMax), out, reason);
+    if (!FromShape(b, SectionLines(b.component, sides, pMax), out, reason)) return 0;
+    EndAtZero(out);
+    return 1;
 }
 
 int FromSurface(const T_AXIAL_BASIS& b, std::vector<solver::T_AXIAL_STRENGTH>& out,

@@ -252,7 +252,10 @@ void CPushPath::NoteTurns(bool isEnd)
             continue;
         const bool wasBack = was.on == ON::Back, isBack = now.On() == ON::Back;
         if (now.HasGap() && wasBack != isBack) {
-            if (wasBack || now.Flowed() > 0.0) // it begins with its gap open
+            const bool isStart = // it begins with its gap open
+                now.Flowed() == 0.0 &&
+                std::ranges::all_of(m_factors, [](double by) { return by == 0.0; });
+            if (wasBack || !isStart)
                 note(wasBack ? HINGE_TURN::Contact : HINGE_TURN::Slip, now.Vertex());
             continue;
         }
