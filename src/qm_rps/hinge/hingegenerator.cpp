@@ -171,7 +171,7 @@ int CHingeGenerator::Generate(int hingeType, const std::vector<int>& elements,
     for (const auto& [key, hinge] : m_doc.Data().Model().hinges)
         if (fresh.contains(hinge.element) && !keys.emplace(hinge.element, key).second)
             extra.insert(key);
-    CEditScope edit(m_doc, "hinges of elements");
+    CEditScope edit(m_doc, "hinges of elements", EDIT_STEP::Join);
     for (const int key : extra)
         (void)edit.Erase<T_PHGE_D>(key);
     for (const auto& [element, hinge] : fresh) {

@@ -36,10 +36,10 @@ public:
     [[nodiscard]] int CalcHinge(int hingeType, int element, T_PHGE_D& out,
                                 T_HINGE_REFUSAL& refusal) const;
 
-    /// Hinges of a type for elements as one undoable edit. An element that has hinges keeps the key
-    /// of the first; its others go. 1 done; 0 with the refusal of the first element that can't have
-    /// one (element 0: the type does not exist or breaks a rule, or no element is named), the
-    /// document unchanged.
+    /// Hinges of a type for elements as one undoable edit, or as a part of the one that is open. An
+    /// element that has hinges keeps the key of the first; its others go. 1 done; 0 with the
+    /// refusal of the first element that can't have one (element 0: the type does not exist or
+    /// breaks a rule, or no element is named), the document unchanged.
     [[nodiscard]] int Generate(int hingeType, const std::vector<int>& elements,
                                T_HINGE_REFUSAL& refusal);
 

@@ -1,0 +1,203 @@
+#include "qm_rps/generate/codehinges.h"
+
+#include "qm_base/say.h"
+#include "qm_db/editscope.h"
+
+#include <algorithm>
+#include <set>
+#include <utility>
+
+struct CCodeHinges::T_GROUP {
+    std::vector<double> inputs;
+    std::vector<int> elements;
+    std::shared_ptr<T_CODE_HINGE> hinge; // null: refused
+    std::string reason;
+};
+
+namespace {
+
+T_HINGE_REFUSAL RefusalOf(int element, const std::string& reason)
+{
+    const std::string text =
+        element == 0 ? reason : Say("IDS_QM_HINGE_ELEMENT", std::to_string(element), reason);
+    return {element, "", reason, text};
+}
+
+std::vector<int> BeamsOf(const T_MODEL& model)
+{
+    std::vector<int> ids;
+    for (const auto& [id, element] : model.elements)
+        if (element.kind == ELEM_KIND::Beam) ids.push_back(id);
+    return ids;
+}
+
+/// "ASCE41-17 column 30x50 2": the first number that is free.
+std::string FreeName(const std::string& stem, std::map<std::string, int>& last,
+                     const std::set<std::string>& taken)
+{
+    int& number = last[stem];
+    std::string name;
+    do
+        name = stem + ' ' + std::to_string(++number);
+    while (taken.contains(name));
+    return name;
+}
+
+/// Hinges of the elements, then generated types that nothing uses.
+void EraseOld(CDBDoc& doc, const std::set<int>& elements, CEditScope& edit)
+{
+    std::vector<int> hinges, types;
+    for (const auto& [key, hinge] : doc.Data().Model().hinges)
+        if (elements.contains(hinge.element)) hinges.push_back(key);
+    for (const int key : hinges)
+        (void)edit.Erase<T_PHGE_D>(key);
+    const T_MODEL& model = doc.Data().Model();
+    for (const auto& [key, type] : model.hingeTypes)
+        if (type.generated && UsersOf(model, KindOf<T_PHGT_D>(), key).empty()) types.push_back(key);
+    for (const int key : types)
+        (void)edit.Erase<T_PHGT_D>(key);
+}
+
+} // namespace
+
+int CCodeHinges::Analyse(std::string& reason)
+{
+    if (m_isAnalysed) return 1;
+    m_isAnalysed = m_axial.Analyse(m_doc.Data().Model(), reason) != 0;
+    return m_isAnalysed ? 1 : 0;
+}
+
+int CCodeHinges::Group(const T_CODE_REQUEST& request, std::vector<T_GROUP>& groups,
+                       T_CODE_HINGES& out, T_HINGE_REFUSAL& refusal)
+{
+    const T_MODEL& model = m_doc.Data().Model();
+    std::map<std::pair<int, int>, std::vector<std::size_t>> alike; // by section and material
+    const auto refuse = [&](int element, const std::string& reason) {
+        refusal = RefusalOf(element, reason);
+        if (request.keepGoing) out.skipped.push_back(refusal);
+        return request.keepGoing;
+    };
+    const std::vector<int> ids = request.elements.empty() ? BeamsOf(model) : request.elements;
+    for (const int id : ids) {
+        T_RC_MEMBER member;
+        std::string reason;
+        if (!ReadMember(model, id, m_axial, member, reason)) {
+            if (!refuse(id, reason)) return 0;
+            continue;
+        }
+        const std::vector<double> inputs = InputsOf(model, member);
+        auto& same = alike[{member.section, member.material}];
+        auto found = std::ranges::find_if(
+            same, [&](std::size_t i) { return SameInputs(groups[i].inputs, inputs); });
+        if (found == same.end()) {
+            T_GROUP& group = groups.emplace_back();
+            group.inputs = inputs;
+            auto hinge = std::make_shared<T_CODE_HINGE>();
+            if (MakeCodeHinge(model, member, request.code, request.secondary, *hinge, group.reason))
+                group.hinge = std::move(hinge);
+            same.push_back(groups.size() - 1);
+            found = same.end() - 1;
+        }
+        T_GROUP& group = groups[*found];
+        if (!group.hinge) {
+            if (!refuse(id, group.reason)) return 0;
+            continue;
+        }
+        group.elements.push_back(id);
+        out.elements.push_back({std::move(member), group.hinge});
+    }
+    std::erase_if(groups, [](const T_GROUP& group) { return !group.hinge; });
+    if (!out.elements.empty()) return 1;
+    if (out.skipped.empty()) refusal = RefusalOf(0, Say("IDS_QM_GEN_NO_ELEMENTS"));
+    return 0;
+}
+
+int CCodeHinges::Store(std::vector<T_GROUP>& groups, const T_CODE_REQUEST& request,
+                       T_HINGE_REFUSAL& refusal)
+{
+    CEditScope edit(m_doc, "hinges of a code");
+    std::set<int> elements;
+    for (const T_GROUP& group : groups)
+        elements.insert(group.elements.begin(), group.elements.end());
+    EraseOld(m_doc, elements, edit);
+    const T_MODEL& model = m_doc.Data().Model();
+    std::set<std::string> taken;
+    for (const auto& entry : model.hingeTypes)
+        taken.insert(entry.second.name);
+    std::map<std::string, int> last;
+    int key = NextKey(model.hingeTypes);
+    std::vector<int> keys;
+    for (T_GROUP& group : groups) {
+        const T_ELEM_D& first = model.elements.at(group.elements.front());
+        T_PHGT_D& type = group.hinge->type;
+        type.name = FreeName(kHingeCodeNames[static_cast<std::size_t>(request.code)] +
+                                 (' ' + model.sections.at(first.section).name),
+                             last, taken);
+        T_PHGT_D shown = type;
+        RecordFromSi(shown, m_doc.Unit().Units());
+        keys.push_back(key);
+        (void)edit.Put(key++, shown);
+    }
+    CHingeGenerator generator(m_doc);
+    for (std::size_t i = 0; i < groups.size(); ++i)
+        if (!generator.Generate(keys[i], groups[i].elements, refusal)) return 0;
+    if (edit.Commit()) return 1;
+    refusal = RefusalOf(0, Say("IDS_QM_HINGE_NOT_STORED"));
+    return 0;
+}
+
+int CCodeHinges::Generate(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
+                          T_HINGE_REFUSAL& refusal)
+{
+    std::string reason;
+    if (!Analyse(reason)) {
+        refusal = RefusalOf(0, reason);
+        return 0;
+    }
+    T_CODE_HINGES made;
+    std::vector<T_GROUP> groups;
+    if (!Group(request, groups, made, refusal) || !Store(groups, request, refusal)) return 0;
+    if (!m_axial.IsLoaded()) made.warnings.push_back({"IDS_QM_GEN_WARN_NO_LOADS", {}});
+    if (!m_doc.Data().Model().pushControl.hingeTypes.empty())
+        made.warnings.push_back({"IDS_QM_GEN_WARN_ACTING", {}});
+    made.types = groups.size();
+    out = std::move(made);
+    return 1;
+}
+
+std::string CCodeHinges::FaultOf(int hingeType)
+{
+    const T_MODEL& model = m_doc.Data().Model();
+    const T_PHGT_D& type = model.hingeTypes.at(hingeType);
+    const auto code = std::ranges::find(kHingeCodeNames, type.generated->code);
+    if (code == kHingeCodeNames.end()) return Say("IDS_QM_GEN_CODE", type.generated->code);
+    std::string reason;
+    if (!Analyse(reason)) return Say("IDS_QM_GEN_NOT_CHECKED", reason);
+    T_RC_MEMBER member;
+    for (const int id : ElementsWithHingeType(model, hingeType)) {
+        if (!ReadMember(model, id, m_axial, member, reason))
+            return Say("IDS_QM_GEN_NOT_CHECKED",
+                       Say("IDS_QM_HINGE_ELEMENT", std::to_string(id), reason));
+        if (!SameInputs(type.generated->inputs, InputsOf(model, member)))
+            return Say("IDS_QM_GEN_STALE", std::to_string(id));
+    }
+    if (member.element == 0) return {}; // no element has it
+    T_CODE_HINGE today;
+    if (!MakeCodeHinge(model, member, static_cast<HINGE_CODE>(code - kHingeCodeNames.begin()),
+                       type.generated->secondary, today, reason))
+        return Say("IDS_QM_GEN_NOT_CHECKED", reason);
+    return SameHinge(type, today.type) ? std::string() : Say("IDS_QM_GEN_EDITED");
+}
+
+std::vector<T_FINDING> CCodeHinges::TypeFindings(int hingeType)
+{
+    const auto found = m_doc.Data().Model().hingeTypes.find(hingeType);
+    if (found == m_doc.Data().Model().hingeTypes.end() || !found->second.generated) return {};
+    const std::string fault = FaultOf(hingeType);
+    if (fault.empty()) return {};
+    T_FINDING finding;
+    finding.field = "generated";
+    finding.ruleText = found->second.generated->code;
+    finding.text = fault;
+    return {finding};
+}

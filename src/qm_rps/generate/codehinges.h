@@ -1,0 +1,56 @@
+// Hinges of reinforced concrete members as a code gives them: from section, bars and initial loads
+// to hinge types that members share and the hinges of elements.
+#pragma once
+
+#include "qm_rps/generate/codehingetype.h"
+#include "qm_rps/hinge/hingefindings.h"
+#include "qm_rps/hinge/hingegenerator.h"
+
+#include <memory>
+
+struct T_CODE_REQUEST {
+    HINGE_CODE code = HINGE_CODE::Asce17;
+    bool secondary = false;
+    std::vector<int> elements; // empty: every beam element of the model
+    bool keepGoing = false;    // leave out what can't have a hinge
+};
+
+/// The hinge of one element.
+struct T_CODE_ELEMENT {
+    T_RC_MEMBER member;
+    std::shared_ptr<const T_CODE_HINGE> hinge; // its type has the name
+};
+struct T_CODE_HINGES {
+    std::vector<T_CODE_ELEMENT> elements;
+    std::vector<T_HINGE_REFUSAL> skipped;
+    std::vector<T_CODE_WARNING> warnings;
+    std::size_t types = 0;
+};
+
+class CCodeHinges {
+public:
+    explicit CCodeHinges(CDBDoc& doc) : m_doc(doc) {}
+
+    /// As one undoable edit: the elements' hinges are replaced, generated types that are left
+    /// without a hinge go. Members with the same section, material, lengths and axial forces share
+    /// a type. 1 done; 0 with the first element that can't have a hinge, the document unchanged.
+    [[nodiscard]] int Generate(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
+                               T_HINGE_REFUSAL& refusal);
+
+    /// Of a generated type: section, material, member or loads are not those that it was made of;
+    /// or they are, and its curves have been edited. Else nothing.
+    std::vector<T_FINDING> TypeFindings(int hingeType);
+
+private:
+    struct T_GROUP;
+    int Analyse(std::string& reason);
+    int Group(const T_CODE_REQUEST& request, std::vector<T_GROUP>& groups, T_CODE_HINGES& out,
+              T_HINGE_REFUSAL& refusal);
+    int Store(std::vector<T_GROUP>& groups, const T_CODE_REQUEST& request,
+              T_HINGE_REFUSAL& refusal);
+    std::string FaultOf(int hingeType);
+
+    CDBDoc& m_doc;
+    CInitialAxial m_axial;
+    bool m_isAnalysed = false;
+};

@@ -1,0 +1,216 @@
+#include "qm_rps/generate/codehingetype.h"
+
+#include "qm_base/say.h"
+#include "qm_rps/generate/axialcurve.h"
+#include "qm_rps/push/lawaxial.h"
+
+#include <algorithm>
+#include <cmath>
+#include <type_traits>
+
+namespace {
+
+int Refuse(std::string& reason, std::string words)
+{
+    reason = std::move(words);
+    return 0;
+}
+
+/// By the signs of an analysis.
+const T_RC_SIDE& SideOf(const T_SIDES<T_RC_SIDE>& sides, HINGE_COMPONENT component, bool positive)
+{
+    return positive != IsSectionSignOpposite(component) ? sides.pos : sides.neg;
+}
+
+/// One side of a curve in plastic deformations. A limit before yield counts at yield.
+T_SKEL_SIDE CurveSide(const T_RC_SIDE& from, bool positive, bool follows)
+{
+    const double sign = positive ? 1.0 : -1.0;
+    const T_CODE_BACKBONE& bone = from.bone;
+    const auto sided = [&](double value) { return value > 0.0 ? sign * value : 0.0; };
+    const auto plastic = [&](double deform) { return sided(bone.Plastic(deform)); };
+    const auto point = [&](const T_CODE_POINT& p) {
+        return T_SKEL_POINT{plastic(p.deform), sided(p.strength)};
+    };
+    T_SKEL_SIDE side;
+    side.yield = follows ? from.momentAtZero : from.moment;
+    side.yieldDeform = bone.yieldDeform;
+    side.B = point(bone.B);
+    side.C = point(bone.C);
+    side.D = point(bone.D);
+    side.E = point(bone.E);
+    if (!bone.acceptance) return side;
+    side.IO = plastic((*bone.acceptance)[0]);
+    side.LS = plastic((*bone.acceptance)[1]);
+    side.CP = plastic((*bone.acceptance)[2]);
+    return side;
+}
+
+template <class CURVE>
+CURVE FilledCurve(const T_SIDES<T_RC_SIDE>& sides, HINGE_COMPONENT component, bool follows)
+{
+    CURVE curve;
+    curve.symmetric = false;
+    curve.autoYield = false;
+    curve.measure = SKEL_MEASURE::Plastic;
+    curve.strengthLoss = sides.pos.bone.strengthLoss || sides.neg.bone.strengthLoss;
+    for (const bool positive : {true, false})
+        (positive ? curve.sides.pos : curve.sides.neg) =
+            CurveSide(SideOf(sides, component, positive), positive, follows);
+    return curve;
+}
+
+T_SKEL_CURVE CurveOf(const T_SIDES<T_RC_SIDE>& sides, HINGE_COMPONENT component, bool follows,
+                     bool chord)
+{
+    if (chord) return FilledCurve<T_SKEL_EC8>(sides, component, follows);
+    return FilledCurve<T_SKEL_FEMA>(sides, component, follows);
+}
+
+void WarnEarly(const T_SIDES<T_RC_SIDE>& sides, T_CODE_HINGE& hinge)
+{
+    const T_CODE_WARNING early{"IDS_QM_GEN_WARN_EARLY", {}};
+    for (const T_RC_SIDE* side : {&sides.pos, &sides.neg}) {
+        const auto& limits = side->bone.acceptance;
+        const bool before = limits && (*limits)[1] < side->bone.yieldDeform;
+        if (before && std::ranges::find(hinge.warnings, early) == hinge.warnings.end())
+            hinge.warnings.push_back(early);
+    }
+}
+
+/// Where the component has hinges; none: both ends are released.
+std::optional<HINGE_LOCATION> LocationOf(const T_RC_MEMBER& member, HINGE_COMPONENT component)
+{
+    const auto at = static_cast<std::size_t>(component);
+    const bool i = !member.release.I[at], j = !member.release.J[at];
+    if (i && j) return HINGE_LOCATION::BothEnds;
+    if (i) return HINGE_LOCATION::IEnd;
+    return j ? std::optional(HINGE_LOCATION::JEnd) : std::nullopt;
+}
+
+/// The backbones of both ends about the axes that have hinges.
+int Bend(const T_MODEL& model, const T_RC_MEMBER& member, HINGE_CODE code, bool secondary,
+         T_CODE_HINGE& hinge, std::string& reason)
+{
+    for (const HINGE_COMPONENT component : member.bending) {
+        if (!LocationOf(member, component)) continue;
+        T_CODE_BENDING bending;
+        bending.component = component;
+        const bool same = !member.column || member.axial.I == member.axial.J;
+        for (const bool atI : {true, false}) {
+            if (!atI && same) {
+                bending.ends.J = bending.ends.I;
+                continue;
+            }
+            const T_RC_END end = EndOf(model, member, code, secondary, component,
+                                       atI ? member.axial.I : member.axial.J);
+            if (!RcHinge(end, atI ? bending.ends.I : bending.ends.J, reason)) return 0;
+        }
+        WarnEarly(bending.ends.I, hinge);
+        WarnEarly(bending.ends.J, hinge);
+        hinge.bending.push_back(std::move(bending));
+    }
+    return hinge.bending.empty() ? Refuse(reason, Say("IDS_QM_PUSH_HINGE_RELEASED")) : 1;
+}
+
+void Fill(const T_RC_MEMBER& member, bool chord, bool follows, T_CODE_HINGE& hinge)
+{
+    T_PHGT_D& type = hinge.type;
+    for (const T_CODE_BENDING& b : hinge.bending) {
+        T_HINGE_COMPONENT& c = type.components[static_cast<std::size_t>(b.component)];
+        c.active = true;
+        c.type = chord ? SKEL_TYPE::Ec8 : SKEL_TYPE::Fema;
+        c.location = *LocationOf(member, b.component);
+        c.curves.I = CurveOf(b.ends.I, b.component, follows, chord);
+        c.curves.J = CurveOf(b.ends.J, b.component, follows, chord);
+        c.sameEnds = c.curves.I == c.curves.J;
+        if (!chord) continue;
+        T_ENDS<double>& length =
+            b.component == HINGE_COMPONENT::My ? type.length.My : type.length.Mz;
+        length = {b.ends.I.pos.hingeLength, b.ends.J.pos.hingeLength};
+    }
+}
+
+/// The numbers that a generator fills.
+class CNumberList {
+public:
+    explicit CNumberList(T_PHGT_D& type)
+    {
+        for (T_HINGE_COMPONENT& c : type.components)
+            for (T_SKEL_CURVE* curve : {&c.curves.I, &c.curves.J})
+                std::visit([this](auto& filled) { Add(filled); }, *curve);
+        for (T_ENDS<double>* length : {&type.length.My, &type.length.Mz})
+            numbers.insert(numbers.end(), {&length->I, &length->J});
+        if (!type.pmm) return;
+        numbers.push_back(&type.pmm->Pmax);
+        Add(type.pmm->curves);
+        if (type.pmm->negative) Add(*type.pmm->negative);
+    }
+    std::vector<double*> numbers;
+
+private:
+    template <class CURVE>
+    void Add([[maybe_unused]] CURVE& curve)
+    {
+        if constexpr (!std::is_same_v<CURVE, T_SKEL_MULTI>)
+            for (T_SKEL_SIDE* s : {&curve.sides.pos, &curve.sides.neg}) {
+                numbers.insert(numbers.end(), {&s->yield, &s->yieldDeform});
+                numbers.insert(numbers.end(), {&s->IO, &s->LS, &s->CP});
+                for (T_SKEL_POINT* p : {&s->B, &s->C, &s->D, &s->E})
+                    numbers.insert(numbers.end(), {&p->deform, &p->strength});
+            }
+    }
+    void Add(T_PMM_CURVES& curves)
+    {
+        for (auto& curve : curves)
+            for (T_PM_POINT& p : curve)
+                numbers.insert(numbers.end(), {&p.p, &p.m});
+    }
+};
+
+} // namespace
+
+int MakeCodeHinge(const T_MODEL& model, const T_RC_MEMBER& member, HINGE_CODE code, bool secondary,
+                  T_CODE_HINGE& out, std::string& reason)
+{
+    T_CODE_HINGE hinge;
+    if (!Bend(model, member, code, secondary, hinge, reason)) return 0;
+    T_PHGT_D& type = hinge.type;
+    type.material = MATL_CLASS::Concrete;
+    if (member.column) {
+        std::vector<T_RC_END> ends;
+        for (const T_CODE_BENDING& b : hinge.bending)
+            ends.push_back(EndOf(model, member, code, secondary, b.component, member.axial.I));
+        type.pmm = AxialCurve(ends, member.axial);
+        if (type.pmm)
+            type.interaction = HINGE_INTERACTION::User;
+        else
+            hinge.warnings.push_back({"IDS_QM_GEN_WARN_NO_PM", {}});
+    }
+    Fill(member, IsChordCode(code), type.pmm.has_value(), hinge);
+    type.generated =
+        T_GENERATED{kHingeCodeNames[static_cast<std::size_t>(code)], secondary,
+                    member.column ? member.axial : T_ENDS<double>{}, InputsOf(model, member)};
+    out = std::move(hinge);
+    return 1;
+}
+
+bool SameHinge(T_PHGT_D a, T_PHGT_D b)
+{
+    constexpr double kDigits = 1e-6, kNothing = 1e-12;
+    for (T_PHGT_D* type : {&a, &b}) {
+        type->name.clear();
+        type->generated.reset();
+        type->section = type->sectionMaterial = 0;
+    }
+    const CNumberList first(a), second(b);
+    if (first.numbers.size() != second.numbers.size()) return false;
+    for (std::size_t i = 0; i < first.numbers.size(); ++i) {
+        double& x = *first.numbers[i];
+        const double y = *second.numbers[i];
+        if (!(std::fabs(x - y) <= kNothing + kDigits * std::max(std::fabs(x), std::fabs(y))))
+            return false;
+        x = y;
+    }
+    return a == b;
+}

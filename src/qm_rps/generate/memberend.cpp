@@ -1,0 +1,216 @@
+#include "qm_rps/generate/memberend.h"
+
+#include "qm_base/say.h"
+#include "qm_db/analysisrun.h"
+#include "qm_db/sectionproperties.h"
+#include "qm_rps/push/pushstoreys.h"
+
+#include <algorithm>
+#include <cmath>
+#include <numeric>
+
+namespace {
+
+using T_VECTOR = std::array<double, 3>;
+constexpr double kSameAxial = 1e-6; // of Ag fc
+constexpr auto kMy = HINGE_COMPONENT::My, kMz = HINGE_COMPONENT::Mz;
+
+double Dot(const T_VECTOR& a, const T_VECTOR& b)
+{
+    return std::inner_product(a.begin(), a.end(), b.begin(), 0.0);
+}
+
+/// The end of the elastic part: node and rigid offset.
+T_VECTOR PlaceOf(const T_MODEL& model, int node, const std::array<double, 3>& offset)
+{
+    T_VECTOR place{};
+    const T_NODE_D& record = model.nodes.at(node);
+    for (std::size_t i = 0; i < place.size(); ++i)
+        place[i] = record.xyz[i] + offset[i];
+    return place;
+}
+
+/// Local z before it is made normal to the axis x, a unit vector.
+T_VECTOR ReferenceOf(const T_ELEM_D& e, const T_VECTOR& x)
+{
+    constexpr double kVertical = 1e-6;
+    if (e.zAxis != T_VECTOR{}) return e.zAxis;
+    return std::hypot(x[0], x[1]) < kVertical ? T_VECTOR{1.0, 0.0, 0.0} : T_VECTOR{0.0, 0.0, 1.0};
+}
+
+/// About which local axes the member bends.
+std::vector<HINGE_COMPONENT> BendingOf(const T_MODEL& model, const T_ELEM_D& e, const T_VECTOR& x,
+                                       bool column)
+{
+    if (!model.styp.plane)
+        return column ? std::vector<HINGE_COMPONENT>{kMy, kMz} : std::vector<HINGE_COMPONENT>{kMy};
+    constexpr std::array<std::size_t, 3> kNormals{2, 1, 0}; // of XY, XZ, YZ
+    const std::size_t normal = kNormals[static_cast<std::size_t>(*model.styp.plane)];
+    const T_VECTOR z = ReferenceOf(e, x);
+    // Along the normal the part of z that is normal to x is that of z itself: x lies in the plane.
+    const double along = Dot(z, x);
+    const double size = std::sqrt(std::max(0.0, Dot(z, z) - along * along));
+    return {std::fabs(z[normal]) > 0.5 * size ? kMz : kMy};
+}
+
+int Refuse(std::string& reason, std::string words)
+{
+    reason = std::move(words);
+    return 0;
+}
+
+/// Compressive strength of the concrete alone, the measure of axial forces.
+double SquashLoad(const T_SECT_D& section, const T_MATL_D& material)
+{
+    const double fc = std::max(material.fck, material.mean.value_or(T_MATL_MEAN{}).fc);
+    return section.size[0] * section.size[1] * fc;
+}
+
+void Append(std::vector<double>& to, std::initializer_list<double> values)
+{
+    to.insert(to.end(), values);
+}
+
+void AppendMaterial(const T_MATL_D& m, std::vector<double>& to)
+{
+    const T_MATL_MEAN mean = m.mean.value_or(T_MATL_MEAN{});
+    Append(to, {m.E, m.fck, m.fyk, m.Es, mean.fc, mean.fy, mean.fyw});
+    Append(to,
+           {m.confidence.value_or(0.0), m.knowledge ? 1.0 + static_cast<int>(*m.knowledge) : 0.0});
+}
+
+void AppendSection(const T_SECT_D& s, std::vector<double>& to)
+{
+    const T_SECT_DETAIL d = s.detailing.value_or(T_SECT_DETAIL{});
+    Append(to, {s.size[0], s.size[1], d.cover, d.stirrupDiameter, d.stirrupSpacing, d.lapLength});
+    Append(to, {1.0 * d.legsY, 1.0 * d.legsZ, 1.0 * static_cast<int>(d.hooks),
+                d.tiesInCore ? 1.0 : 0.0, d.poorSplice ? 1.0 : 0.0});
+    for (const T_REBAR& bar : s.bars)
+        Append(to, {bar.y, bar.z, bar.area});
+}
+
+} // namespace
+
+int CInitialAxial::Analyse(const T_MODEL& model, std::string& reason)
+{
+    const std::vector<T_PUSH_INITIAL_LOAD>& loads = model.pushControl.initialLoads;
+    m_isLoaded = !loads.empty();
+    if (!m_isLoaded) return 1;
+    T_ANALYSIS_OPTIONS options;
+    options.allCases = options.stages = false;
+    for (const T_PUSH_INITIAL_LOAD& load : loads)
+        options.cases.push_back(load.loadCase);
+    T_ANALYSIS_RESULTS results;
+    T_ANALYSIS_ERROR error;
+    if (!CAnalysisRun::Compute(model, options, nullptr, results, error))
+        return Refuse(reason, error.text);
+    for (const T_PUSH_INITIAL_LOAD& load : loads)
+        for (const auto& entry : model.elements) {
+            T_ELEM_FORCES forces;
+            const auto found = results.cases.find(load.loadCase);
+            if (found == results.cases.end() || !found->second->ReadForces(entry.first, forces))
+                continue; // a spring has none
+            T_ENDS<double>& axial = m_axial[entry.first];
+            axial.I -= load.factor * forces.front()[0];
+            axial.J -= load.factor * forces.back()[0];
+        }
+    return 1;
+}
+
+T_ENDS<double> CInitialAxial::Of(int element) const
+{
+    const auto found = m_axial.find(element);
+    return found == m_axial.end() ? T_ENDS<double>{} : found->second;
+}
+
+int ReadMember(const T_MODEL& model, int element, const CInitialAxial& axial, T_RC_MEMBER& out,
+               std::string& reason)
+{
+    const auto found = model.elements.find(element);
+    if (found == model.elements.end()) return Refuse(reason, Say("IDS_CMD_IEHP_NO_ELEM"));
+    const T_ELEM_D& e = found->second;
+    if (e.kind != ELEM_KIND::Beam) return Refuse(reason, Say("IDS_QM_GEN_NO_BEAM"));
+    if (!model.sections.contains(e.section)) return Refuse(reason, Say("IDS_CMD_IEHP_NO_SECT"));
+    if (!model.materials.contains(e.material)) return Refuse(reason, Say("IDS_CMD_IEHP_NO_MATL"));
+    if (e.member != 0)
+        for (const auto& [id, other] : model.elements)
+            if (id != element && other.member == e.member)
+                return Refuse(reason, Say("IDS_QM_GEN_PARTS", std::to_string(e.member)));
+    T_VECTOR x = PlaceOf(model, e.nodeJ, e.offset.J);
+    const T_VECTOR start = PlaceOf(model, e.nodeI, e.offset.I);
+    T_VECTOR whole = PlaceOf(model, e.nodeJ, {});
+    const T_VECTOR nodeI = PlaceOf(model, e.nodeI, {});
+    for (std::size_t i = 0; i < x.size(); ++i) {
+        x[i] -= start[i];
+        whole[i] -= nodeI[i];
+    }
+    T_RC_MEMBER m;
+    m.clear = std::sqrt(Dot(x, x));
+    m.length = std::sqrt(Dot(whole, whole));
+    if (!(m.clear > 0.0) || !(Dot(x, whole) > 0.0)) return Refuse(reason, Say("IDS_QM_GEN_CLEAR"));
+    for (double& component : x)
+        component /= m.clear;
+    m.element = element;
+    m.section = e.section;
+    m.material = e.material;
+    m.column = std::fabs(x[VerticalAxis(model)]) > std::sqrt(0.5);
+    m.bending = BendingOf(model, e, x, m.column);
+    m.axial = axial.Of(element);
+    const double squash = SquashLoad(model.sections.at(e.section), model.materials.at(e.material));
+    if (std::fabs(m.axial.I - m.axial.J) <= kSameAxial * squash) m.axial.J = m.axial.I;
+    m.release = e.release;
+    out = std::move(m);
+    return 1;
+}
+
+T_RC_END EndOf(const T_MODEL& model, const T_RC_MEMBER& member, HINGE_CODE code, bool secondary,
+               HINGE_COMPONENT component, double axial)
+{
+    T_RC_END end;
+    end.code = code;
+    end.secondary = secondary;
+    end.column = member.column;
+    end.aboutY = component == kMy;
+    end.section = model.sections.at(member.section);
+    end.material = model.materials.at(member.material);
+    SECT_FAULT fault = SECT_FAULT::None;
+    (void)CSectionProperties::Calc(end.section, end.section, fault); // judged with the strengths
+    end.clear = member.clear;
+    end.axial = axial;
+    end.EI = end.material.E * (end.aboutY ? end.section.Iyy : end.section.Izz);
+    end.length = member.length;
+    return end;
+}
+
+std::vector<double> InputsOf(const T_MODEL& model, const T_RC_MEMBER& member)
+{
+    const T_SECT_D& section = model.sections.at(member.section);
+    const T_MATL_D& material = model.materials.at(member.material);
+    const double squash = SquashLoad(section, material);
+    // Axial forces first, over the squash load, so that their tolerance is that of all.
+    std::vector<double> inputs;
+    for (const double force : {member.axial.I, member.axial.J})
+        inputs.push_back(member.column && squash > 0.0 ? force / squash : 0.0);
+    Append(inputs, {member.column ? 1.0 : 0.0, member.clear, member.length});
+    for (const HINGE_COMPONENT c : {kMy, kMz}) {
+        const auto at = static_cast<std::size_t>(c);
+        Append(inputs, {member.release.I[at] ? 1.0 : 0.0, member.release.J[at] ? 1.0 : 0.0});
+        Append(inputs, {std::ranges::count(member.bending, c) > 0 ? 1.0 : 0.0});
+    }
+    AppendMaterial(material, inputs);
+    AppendSection(section, inputs);
+    return inputs;
+}
+
+bool SameInputs(const std::vector<double>& a, const std::vector<double>& b)
+{
+    constexpr double kDigits = 1e-9; // a file in other units gives back this much
+    constexpr std::size_t kForces = 2;
+    if (a.size() != b.size()) return false;
+    for (std::size_t i = 0; i < a.size(); ++i) {
+        const double most =
+            i < kForces ? kSameAxial : kDigits * std::max(std::fabs(a[i]), std::fabs(b[i]));
+        if (!(std::fabs(a[i] - b[i]) <= most)) return false;
+    }
+    return true;
+}
