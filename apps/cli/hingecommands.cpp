@@ -3,6 +3,7 @@
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
 #include "qm_db/recordfacts.h"
+#include "qm_rps/generate/codehinges.h"
 #include "qm_rps/hinge/hingegenerator.h"
 #include "qm_rps/hinge/hingetypefindings.h"
 #include "qm_rps/po_hingetypedlg.h"
@@ -156,6 +157,7 @@ EXIT_CODE RunHingeCheck(const T_HINGE_OPTIONS& o)
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     const T_HINGE_CONTEXT context = HingeContextOf(doc);
     const CHingeGenerator generator(doc);
+    CCodeHinges codeHinges(doc);
     std::size_t findings = 0, types = 0, warnings = 0;
     const EXIT_CODE code = ForEachType(doc, o.type, [&](int key, const T_PHGT_D& type) {
         ++types;
@@ -169,6 +171,7 @@ EXIT_CODE RunHingeCheck(const T_HINGE_OPTIONS& o)
         findings += print(kFinding, HingeTypeFindings(type, context));
         findings += print(kFinding, generator.ElementFindings(key));
         warnings += print("IDS_QM_CLI_HINGE_WARNING", HingeTypeWarnings(type));
+        warnings += print("IDS_QM_CLI_HINGE_WARNING", codeHinges.TypeFindings(key));
     });
     if (code != EXIT_CODE::Done) return code;
     PrintLine(Say("IDS_QM_CLI_HINGE_FINDINGS", std::to_string(types), std::to_string(findings)));

@@ -1,7 +1,33 @@
 // The arguments of the commands on hinge types and pushover load cases.
+#include "hinge/generatehinges.h"
 #include "hingecommands.h"
 #include "registershared.h"
 #include "registrations.h"
+
+namespace {
+
+void AddGenerate(CLI::App* hinge, EXIT_CODE& code)
+{
+    const T_GROUP group{hinge, "examples/rc-frame-code-hinges/case.json", code};
+    const auto o = std::make_shared<T_HINGE_GENERATE_OPTIONS>();
+    auto* sub = AddOne(group, "generate", Say("IDS_QM_HELP_HINGE_GENERATE"),
+                       " --code ASCE41-17 --all -o generated.json", o, RunHingeGenerate);
+    sub->add_option("--code", o->code, Say("IDS_QM_HELP_HINGE_CODE"))
+        ->required()
+        ->check(CLI::IsMember(
+            std::vector<std::string>(kHingeCodeNames.begin(), kHingeCodeNames.end())));
+    sub->add_option("--elements", o->elements, Say("IDS_QM_HELP_HINGE_ELEMENTS"));
+    sub->add_flag("--all", o->all, Say("IDS_QM_HELP_HINGE_ALL"));
+    sub->add_option("--level", o->level, Say("IDS_QM_HELP_HINGE_LEVEL"))
+        ->check(CLI::IsMember({"primary", "secondary"}));
+    sub->add_flag("--keep-going", o->keepGoing, Say("IDS_QM_HELP_HINGE_KEEP_GOING"));
+    sub->add_flag("--trace", o->trace, Say("IDS_QM_HELP_HINGE_TRACE"));
+    AddJson(sub, o->json);
+    sub->add_option("-o", o->out, Say("IDS_QM_HELP_TO_WRITE"))->required();
+    AddOverwrite(sub, o->overwrite);
+}
+
+} // namespace
 
 void AddHingeCommands(CLI::App& app, EXIT_CODE& code)
 {
@@ -26,6 +52,7 @@ void AddHingeCommands(CLI::App& app, EXIT_CODE& code)
     assign->add_option("-o", o->out, Say("IDS_QM_HELP_TO_WRITE"))->required();
     AddOverwrite(assign, o->overwrite);
     AddOne(hinges, "generated", Say("IDS_QM_HELP_HINGE_GENERATED"), "", o, RunHingeGenerated);
+    AddGenerate(hinge, code);
     auto* convert =
         AddOne(hinges, "convert", Say("IDS_QM_HELP_HINGE_CONVERT"),
                " --type \"steel beam\" --to plastic -o plastic.json", o, RunHingeConvert);

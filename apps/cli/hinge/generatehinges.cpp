@@ -1,0 +1,199 @@
+#include "hinge/generatehinges.h"
+
+#include "inputfile.h"
+#include "output.h"
+#include "qm_base/say.h"
+#include "qm_base/textformat.h"
+#include "qm_rps/desk/elementlist.h"
+#include "qm_rps/generate/codehingerows.h"
+
+#include <algorithm>
+#include <cstdio>
+#include <set>
+
+namespace {
+
+using T_TABLE_ROWS = std::vector<std::vector<std::string>>;
+
+/// Columns under their heads, numbers to the right, the last one to the left.
+std::string TableText(const T_TABLE_ROWS& rows)
+{
+    std::vector<std::size_t> width(rows.front().size());
+    for (const auto& row : rows)
+        for (std::size_t c = 0; c < row.size(); ++c)
+            width[c] = std::max(width[c], row[c].size());
+    std::string text;
+    for (const auto& row : rows) {
+        for (std::size_t c = 0; c + 1 < row.size(); ++c)
+            text += std::string(width[c] - row[c].size(), ' ') + row[c] + "  ";
+        text += row.back() + '\n';
+    }
+    return text;
+}
+
+std::string Number(double value)
+{
+    return FormatText("%.5g", value);
+}
+
+/// a, b, c, IO, LS, CP as plastic rotations; theta_y, DL, SD, NC as chord rotations.
+void AppendBackbone(const T_CODE_BACKBONE& bone, bool chord, std::vector<std::string>& cells)
+{
+    const std::array<double, 3> levels = bone.acceptance.value_or(std::array<double, 3>{});
+    if (chord) {
+        cells.push_back(Number(bone.yieldDeform));
+    } else {
+        cells.push_back(Number(bone.Plastic(bone.C.deform)));
+        cells.push_back(Number(bone.Plastic(bone.E.deform)));
+        cells.push_back(Number(bone.D.strength));
+    }
+    for (const double level : levels)
+        cells.push_back(Number(chord ? level : bone.Plastic(level)));
+}
+
+std::vector<std::string> Heads(bool chord, const T_UNITS& units)
+{
+    const std::string force(NameOf(units.force));
+    std::vector<std::string> heads{Say("IDS_QM_CLI_ELEMENT"),
+                                   Say("IDS_QM_GEN_END"),
+                                   Say("IDS_QM_GEN_AXIS"),
+                                   "+/-",
+                                   "N (" + force + ")",
+                                   "M (" + UnitText(kDimMoment, units) + ")",
+                                   "V/Vn"};
+    const std::vector<std::string> more =
+        chord ? std::vector<std::string>{"theta_y", "DL", "SD", "NC"}
+              : std::vector<std::string>{"a", "b", "c", "IO", "LS", "CP"};
+    heads.insert(heads.end(), more.begin(), more.end());
+    heads.push_back(Say("IDS_QM_CLI_HINGE_TYPE"));
+    return heads;
+}
+
+std::string Table(const T_CODE_HINGES& hinges, bool chord, const T_UNITS& units)
+{
+    T_TABLE_ROWS table{Heads(chord, units)};
+    for (const T_CODE_ELEMENT& element : hinges.elements)
+        for (const T_CODE_ROW_OF_HINGE& row : HingeRows(element)) {
+            std::vector<std::string>& cells = table.emplace_back();
+            cells = {std::to_string(row.element),
+                     row.end,
+                     kComponentNames[static_cast<std::size_t>(row.component)],
+                     row.side,
+                     Number(FromSi(row.axial, units, kDimForce)),
+                     Number(FromSi(row.of->moment, units, kDimMoment)),
+                     Number(row.of->shear / row.of->shearStrength)};
+            AppendBackbone(row.of->bone, chord, cells);
+            cells.push_back(element.hinge->type.name);
+        }
+    return TableText(table);
+}
+
+/// The first element of each type: the others have the same numbers.
+std::vector<const T_CODE_ELEMENT*> OfTypes(const T_CODE_HINGES& hinges)
+{
+    std::vector<const T_CODE_ELEMENT*> firsts;
+    std::set<const T_CODE_HINGE*> seen;
+    for (const T_CODE_ELEMENT& element : hinges.elements)
+        if (seen.insert(element.hinge.get()).second) firsts.push_back(&element);
+    return firsts;
+}
+
+std::string TraceText(const T_CODE_HINGES& hinges, const T_UNITS& units)
+{
+    std::string text;
+    for (const T_CODE_ELEMENT* element : OfTypes(hinges))
+        for (const T_CODE_ROW_OF_HINGE& row : HingeRows(*element)) {
+            text += "\n" +
+                    Say("IDS_QM_GEN_TRACE", element->hinge->type.name, row.end,
+                        kComponentNames[static_cast<std::size_t>(row.component)], row.side) +
+                    "\n";
+            for (const T_CODE_TRACE& line : row.of->trace) {
+                const std::string unit = UnitText(line.dim, units);
+                text += "  " + line.symbol + " = " + Number(FromSi(line.value, units, line.dim)) +
+                        (unit.empty() ? "" : " " + unit);
+                for (const std::string& part : {line.clause, line.text, MarkText(line.mark)})
+                    if (!part.empty()) text += "; " + part;
+                text += "\n";
+            }
+        }
+    return text;
+}
+
+/// Warnings, each once, with the types that have it.
+std::string WarningsText(const T_CODE_HINGES& hinges)
+{
+    std::vector<std::pair<std::string, std::vector<std::string>>> all;
+    const auto add = [&](const T_CODE_WARNING& warning, const std::string& type) {
+        const std::string text = WarningText(warning);
+        auto at = std::ranges::find(all, text, [](const auto& entry) { return entry.first; });
+        if (at == all.end()) at = all.insert(all.end(), {text, {}});
+        if (!type.empty() && (at->second.empty() || at->second.back() != type))
+            at->second.push_back(type);
+    };
+    for (const T_CODE_WARNING& warning : hinges.warnings)
+        add(warning, "");
+    for (const T_CODE_ELEMENT* element : OfTypes(hinges)) {
+        for (const T_CODE_WARNING& warning : element->hinge->warnings)
+            add(warning, element->hinge->type.name);
+        for (const T_CODE_ROW_OF_HINGE& row : HingeRows(*element))
+            for (const T_CODE_WARNING& warning : row.of->warnings)
+                add(warning, element->hinge->type.name);
+    }
+    std::string text;
+    for (const auto& [warning, types] : all) {
+        text += "! " + warning;
+        for (std::size_t i = 0; i < types.size(); ++i)
+            text += (i == 0 ? " [" : ", ") + types[i];
+        text += types.empty() ? "\n" : "]\n";
+    }
+    return text;
+}
+
+EXIT_CODE CheckOptions(const T_HINGE_GENERATE_OPTIONS& o, T_CODE_REQUEST& request)
+{
+    if (o.all == !o.elements.empty())
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_GEN_ONE_OF", "--all", "--elements"));
+    const auto code = std::ranges::find(kHingeCodeNames, o.code);
+    request.code = static_cast<HINGE_CODE>(code - kHingeCodeNames.begin());
+    request.secondary = o.level == "secondary";
+    request.keepGoing = o.keepGoing;
+    const std::optional<std::vector<int>> elements = ParseElementList(o.elements);
+    if (!elements)
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_ELEMENT_LIST", o.elements));
+    request.elements = *elements;
+    return CheckOutputs(o.file, {{o.out, OUTPUT_KIND::Document}, {o.json, OUTPUT_KIND::Json}},
+                        o.overwrite);
+}
+
+} // namespace
+
+EXIT_CODE RunHingeGenerate(const T_HINGE_GENERATE_OPTIONS& o)
+{
+    T_CODE_REQUEST request;
+    if (const EXIT_CODE code = CheckOptions(o, request); code != EXIT_CODE::Done) return code;
+    CDBDoc doc;
+    if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
+    T_CODE_HINGES hinges;
+    T_HINGE_REFUSAL refusal;
+    if (!CCodeHinges(doc).Generate(request, hinges, refusal))
+        return Complain(EXIT_CODE::BadInput, o.file + ": " + refusal.text);
+    const T_UNITS units = doc.Unit().Units();
+    if (o.json != "-") {
+        const bool chord = IsChordCode(request.code);
+        const std::string text = Table(hinges, chord, units) +
+                                 (o.trace ? TraceText(hinges, units) : "") + WarningsText(hinges);
+        std::fputs(text.c_str(), stdout);
+    }
+    for (const T_HINGE_REFUSAL& skipped : hinges.skipped)
+        (void)Complain(EXIT_CODE::NotFound, Say("IDS_QM_GEN_SKIPPED", skipped.text));
+    if (const EXIT_CODE code = SaveDocument(doc, o.out); code != EXIT_CODE::Done) return code;
+    if (!o.json.empty())
+        if (const EXIT_CODE code = WriteOutput(o.json, CodeHingesJson(hinges, o.code, units));
+            code != EXIT_CODE::Done)
+            return code;
+    if (o.json != "-")
+        std::printf("%s\n", Say("IDS_QM_GEN_DONE", std::to_string(hinges.elements.size()),
+                                std::to_string(hinges.types))
+                                .c_str());
+    return hinges.skipped.empty() ? EXIT_CODE::Done : EXIT_CODE::NotFound;
+}

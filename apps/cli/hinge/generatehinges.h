@@ -1,0 +1,27 @@
+// Hinges of reinforced concrete members as a code gives them.
+#pragma once
+
+#include "exitcodes.h"
+#include "qm_rps/generate/codehinges.h"
+
+#include <string>
+
+struct T_HINGE_GENERATE_OPTIONS {
+    std::string file;
+    std::string code;     // one of kHingeCodeNames
+    std::string elements; // "1,4-9"
+    bool all = false;
+    std::string level = "primary"; // or "secondary"
+    bool keepGoing = false;
+    std::string json, out;
+    bool trace = false;
+    bool overwrite = false;
+};
+
+/// Generates, prints the table, writes the file. BadInput with the first element that can't have a
+/// hinge, nothing written; with --keep-going NotFound where elements were left out.
+EXIT_CODE RunHingeGenerate(const T_HINGE_GENERATE_OPTIONS& options);
+
+/// Every generated number with its inputs, clause and mark, type by type.
+std::string CodeHingesJson(const T_CODE_HINGES& hinges, const std::string& code,
+                           const T_UNITS& units);
