@@ -15,6 +15,7 @@ namespace {
 constexpr auto K = CODE_MARK::Computed;
 constexpr const char* kBending = "EN 1992-1-1 3.1.7, 6.1";
 constexpr const char* kCapacity = "";
+constexpr T_UNITS kSi{FORCE_UNIT::N, LENGTH_UNIT::m};
 
 /// What both sides share.
 struct T_BASIS {
@@ -215,8 +216,8 @@ int Moment(const T_BASIS& in, bool positive, double axial, double& moment, std::
 {
     SECT_FAULT fault = SECT_FAULT::None;
     const T_MATL_D material = AssessedMaterial(in.end.material, in.material);
-    if (CSectionStrength::CalcMoment(in.end.section, material, kSiUnits, in.end.aboutY, positive,
-                                     axial, moment, fault) &&
+    if (CSectionStrength::CalcMoment(in.end.section, material, kSi, in.end.aboutY, positive, axial,
+                                     moment, fault) &&
         moment > 0.0)
         return 1;
     reason = fault == SECT_FAULT::Values || fault == SECT_FAULT::None
