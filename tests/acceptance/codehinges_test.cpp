@@ -181,7 +181,7 @@ TEST_F(CodeHinges, AreRefusedWithTheMemberAndTheReason)
         {"/materials/0/confidence_factor", "0.9", "at least 1", "EN1998-3"},
         {"/materials/0/type", "\"steel\"", "Element 1: type: concrete", "ASCE41-17"},
         {"/load_cases/0/nodal/0/load/2", "-9000", "does not carry the axial force", "ASCE41-17"},
-        {"/elements/1/offset", R"({"I": [2.3, 0, 0], "J": [-2.3, 0, 0]})", "no clear length",
+        {"/elements/1/offset", R"({"I": [2.3, 0, 0], "J": [-2.3, 0, 0]})", "beam 2: zero length",
          "ASCE41-17"},
         {"/design_codes", "null", "Eurocode", "EN1998-3"},
     };
