@@ -196,6 +196,7 @@ std::optional<T_CODE_BACKBONE> EnBackbone(const T_BASIS& in, T_RC_SIDE& side, CC
     side.shearStrength =
         sheet.Put("VR", std::min(cyclic->strength, monotonic->strut), kDimForce,
                   "EN 1998-3 A.3.3.1", "min(VR; VRd,max), 45 degrees", CODE_MARK::SightedOnce);
+    sheet.Warn("IDS_QM_GEN_WARN_GAMMA", {});
     side.hingeLength = *length;
     sheet.Put("My LV/(3 theta_y EI)",
               found->yield.moment * in.end.clear / (6.0 * found->thetaY * in.end.EI),
