@@ -103,6 +103,10 @@ struct T_PUSH_STAGE {
     std::vector<double> steps;
     std::vector<double> additional; // displacements of the control node that are steps too
     T_PUSH_STOPS stops;
+    /// Displacement control: where no path of equilibrium leads on, the run goes on at the next
+    /// step in a state that is in equilibrium again, each hinge deformed as little further as its
+    /// own condition needs. Else the run ends there.
+    bool leaps = false;
 };
 
 /// Factors of the six directions that displacement and reaction of a stage are taken along.

@@ -33,11 +33,12 @@ struct T_PUSH_STEP {
 };
 
 enum class HINGE_TURN {
-    Point,  // reached a vertex of its backbone: `point` counts from 1 (yield)
-    Unload, // left the backbone
-    Reload, // came back to it
-    Slip,   // began to move without force
-    Contact // came to the end of its gap, or of its slip
+    Point,   // reached a vertex of its backbone: `point` counts from 1 (yield)
+    Unload,  // left the backbone
+    Reload,  // came back to it
+    Slip,    // began to move without force
+    Contact, // came to the end of its gap, or of its slip
+    Leap     // gave way where no path of equilibrium leads on
 };
 
 struct T_HINGE_EVENT {
@@ -71,7 +72,8 @@ enum class PUSH_OUTCOME {
     TooManyEvents,
     OutOfBalance, // a step does not keep equilibrium
     Cancelled,
-    Mechanism, // that does not move the control node, under loads that can't grow
+    Mechanism,      // that does not move the control node, under loads that can't grow
+    ReachedByLeaps, // the target, over places without a path of equilibrium
 };
 
 struct T_PUSH_END {

@@ -47,7 +47,7 @@ TEST_F(PushSetup, EveryKeyIsSetAndTakenBack)
     Done("push setup g.json --case PX --rename P2 --control-node 332 --direction DY --follow "
          "largest --patterns static:G=0.5 acceleration:DY=-2 --eccentricity -0.1 --largest 0.3 "
          "--function slow --stiffness-ratio 0.02 --angle 90 --initial-loads none --p-delta none "
-         "--steps 12 --on-failure drop --drift 0.03 --state CP --fraction-of-peak 0.8 "
+         "--steps 12 --on-failure leap --drift 0.03 --state CP --fraction-of-peak 0.8 "
          "--additional 0.05 0.1 --additional-evaluations on -o c.json");
     ExpectKeys(CaseOf(Exported("c.json"), "P2"),
                {{"/control_node", "332"},
@@ -68,7 +68,7 @@ TEST_F(PushSetup, EveryKeyIsSetAndTakenBack)
                 {"/initial_loads", "[]"},
                 {"/p_delta", "\"none\""},
                 {"/steps", "12"},
-                {"/on_failure", "\"drop\""},
+                {"/on_failure", "\"leap\""},
                 {"/stops", R"({"drift": 0.03, "state": "CP", "fraction_of_peak": 0.8})"},
                 {"/additional_displacements", "[0.05, 0.1]"},
                 {"/additional_evaluations", "true"}});

@@ -13,7 +13,7 @@ inline constexpr std::array<const char*, 5> kLengthNames{"mm", "cm", "m", "in", 
 
 /// By PUSH_P_DELTA, PUSH_FAILURE, PUSH_FLOW and PUSH_STATE_STOP.
 inline constexpr std::array<const char*, 3> kPDeltaNames{"none", "initial", "updated"};
-inline constexpr std::array<const char*, 2> kPushFailureNames{"drop", "stop"};
+inline constexpr std::array<const char*, 3> kPushFailureNames{"drop", "stop", "leap"};
 inline constexpr std::array<const char*, 2> kPushFlowNames{"rotations", "associated"};
 inline constexpr std::array<const char*, 3> kStateStopNames{"LS", "CP", "failed"};
 

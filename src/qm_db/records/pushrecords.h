@@ -18,8 +18,9 @@ struct T_PUSH_INITIAL_LOAD {
 
 /// Axial forces that P-Delta takes: none, those of the initial loads, those of each stored step.
 enum class PUSH_P_DELTA { None, Initial, Updated };
-/// What a hinge beyond its strength does: it loses it along its backbone, or the run stops.
-enum class PUSH_FAILURE { Drop, Stop };
+/// What a hinge beyond its strength does: it loses it along its backbone, or the run stops. Leap:
+/// it loses it, and where no equilibrium leads on the run goes on at its next step.
+enum class PUSH_FAILURE { Drop, Stop, Leap };
 /// Flow of hinges with interaction: in the rotations alone, or normal to the yield surface.
 enum class PUSH_FLOW { Rotations, Associated };
 /// State that the first hinge may not pass.

@@ -36,8 +36,9 @@ constexpr T_OUTCOME_WORD kOutcomes[] = {{O::Reached, "reached"},
                                         {O::TooManyEvents, "too many events"},
                                         {O::OutOfBalance, "out of balance"},
                                         {O::Cancelled, "cancelled"},
-                                        {O::Mechanism, "mechanism elsewhere"}};
-static_assert(std::size(kOutcomes) == static_cast<std::size_t>(O::Mechanism) + 1);
+                                        {O::Mechanism, "mechanism elsewhere"},
+                                        {O::ReachedByLeaps, "reached by leaps"}};
+static_assert(std::size(kOutcomes) == static_cast<std::size_t>(O::ReachedByLeaps) + 1);
 
 /// Members of "push_results" that are whole numbers, and those that are not.
 struct T_WHOLE {

@@ -110,12 +110,11 @@ int CBlockPushRun::ReadEvents(std::vector<T_RUN_EVENT>& out)
                 WholeOf(kPart, n[0], -1, kLargest), n[1], n[2], n[3], VectorAt(n, 4), {}});
             const auto left = static_cast<int>((turns.size() - turn) / 4);
             for (int i = WholeOf(kPart, n[10], 0, left); i > 0; --i, turn += 4)
-                event.turns.push_back({WholeOf(kTurns, turns[turn], 0, m_row.hinges - 1),
-                                       static_cast<solver::HINGE_TURN>(
-                                           WholeOf(kTurns, turns[turn + 1], 0,
-                                                   static_cast<int>(solver::HINGE_TURN::Contact))),
-                                       turns[turn + 2],
-                                       WholeOf(kTurns, turns[turn + 3], 0, 1) == 1});
+                event.turns.push_back(
+                    {WholeOf(kTurns, turns[turn], 0, m_row.hinges - 1),
+                     static_cast<solver::HINGE_TURN>(WholeOf(
+                         kTurns, turns[turn + 1], 0, static_cast<int>(solver::HINGE_TURN::Leap))),
+                     turns[turn + 2], WholeOf(kTurns, turns[turn + 3], 0, 1) == 1});
         }
         if (turn != turns.size()) ThrowBadBlock(RunKey(m_row, kTurns));
     });

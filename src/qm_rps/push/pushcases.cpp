@@ -87,6 +87,7 @@ public:
         stage.additional = record.additionalDisplacements;
         PutTarget(*record.control, increments.target, stage);
         PutStops(record, control, stage.stops);
+        stage.leaps = control.onFailure == PUSH_FAILURE::Leap;
         if (!BuildPattern(m_model, m_frame, record, m_modeShape, stage.loads, error)) return 0;
         // By load the push finds its way; only the displacement and the reaction say nothing of it.
         if (stage.control != solver::PUSH_CONTROL::LoadFactor &&

@@ -15,7 +15,7 @@ struct T_ROW {
 
 // In the order of solver::PUSH_OUTCOME.
 // clang-format off
-constexpr std::array<T_ROW, 16> kRows{{
+constexpr std::array<T_ROW, 17> kRows{{
     {PUSH_STATUS::Reached, "IDS_QM_PUSH_END_REACHED", "IDS_QM_PUSH_ADVICE_REACHED"},
     {PUSH_STATUS::Failed, "IDS_QM_PUSH_END_NO_EQUILIBRIUM", "IDS_QM_PUSH_ADVICE_NO_EQUILIBRIUM"},
     {PUSH_STATUS::Stopped, "IDS_QM_PUSH_END_DRIFT", "IDS_QM_PUSH_ADVICE_DRIFT"},
@@ -32,9 +32,10 @@ constexpr std::array<T_ROW, 16> kRows{{
     {PUSH_STATUS::Failed, "IDS_QM_PUSH_END_BALANCE", "IDS_QM_PUSH_ADVICE_BALANCE"},
     {PUSH_STATUS::Failed, "IDS_QM_PUSH_END_CANCELLED", "IDS_QM_PUSH_ADVICE_CANCELLED"},
     {PUSH_STATUS::Failed, "IDS_QM_PUSH_END_MECHANISM", "IDS_QM_PUSH_ADVICE_MECHANISM"},
+    {PUSH_STATUS::Reached, "IDS_QM_PUSH_END_LEAPS", "IDS_QM_PUSH_ADVICE_LEAPS"},
 }};
 // clang-format on
-static_assert(kRows.size() == static_cast<std::size_t>(solver::PUSH_OUTCOME::Mechanism) + 1);
+static_assert(kRows.size() == static_cast<std::size_t>(solver::PUSH_OUTCOME::ReachedByLeaps) + 1);
 
 const T_ROW& RowOf(solver::PUSH_OUTCOME outcome)
 {

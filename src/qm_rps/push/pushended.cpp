@@ -48,8 +48,10 @@ std::optional<zql::frx::T_MESSAGE> PushRemark(CDBDoc& doc, const std::string& pu
     const std::optional<T_PUSH_NAME> name = FindPush(doc.Data().Model(), push);
     if (!name) return std::nullopt;
     const std::optional<T_PUSH_ENDED> ended = PushEndedOf(doc, name->key, name->turn);
-    if (!ended || ended->status != PUSH_STATUS::Failed) return std::nullopt;
-    const char* const text = ended->outcome == solver::PUSH_OUTCOME::Cancelled
+    const bool lept = ended && ended->outcome == solver::PUSH_OUTCOME::ReachedByLeaps;
+    if (!ended || (ended->status != PUSH_STATUS::Failed && !lept)) return std::nullopt;
+    const char* const text = lept ? "IDS_QM_PUSH_CUT_LEAPS"
+                             : ended->outcome == solver::PUSH_OUTCOME::Cancelled
                                  ? "IDS_QM_PUSH_CUT_CANCELLED"
                              : ended->earlier ? "IDS_QM_PUSH_CUT_EARLIER"
                                               : "IDS_QM_PUSH_CUT";

@@ -32,7 +32,8 @@ PUSH_STATE StateOf(const T_PUSH_LAW_PLACE& place, const solver::T_HINGE_LAW& law
 
 std::string EventTarget(const T_PUSH_LAW_PLACE& place, const solver::T_HINGE_EVENT& event)
 {
-    constexpr const char* kTurns[] = {"", "unload", "reload", "slip", "contact"}; // of HINGE_TURN
+    constexpr const char* kTurns[] = {"",     "unload",  "reload",
+                                      "slip", "contact", "leap"}; // of HINGE_TURN
     if (event.turn != solver::HINGE_TURN::Point) return kTurns[static_cast<int>(event.turn)];
     const std::string& letters = event.positive ? place.letters.pos : place.letters.neg;
     const auto at = static_cast<std::size_t>(event.point - 1);

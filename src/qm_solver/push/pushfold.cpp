@@ -138,12 +138,14 @@ bool CPushPath::WantsFold() const
     return static_cast<std::size_t>(count) >= kLeastFolded;
 }
 
-CPushPath::T_FAULT CPushPath::Fold()
+/// folds: what hardens; else nothing stays folded.
+CPushPath::T_FAULT CPushPath::FoldThose(bool folds)
 {
     std::vector<double> compliance(m_structure.RowCount(), 0.0);
     std::vector<std::size_t> again;
     for (std::size_t f = 0; f < m_flows.flows.size(); ++f) {
-        const double before = m_soft[f], now = IsFoldable(f) ? 1.0 / Backbone(f).Slope() : 0.0;
+        const double before = m_soft[f];
+        const double now = folds && IsFoldable(f) ? 1.0 / Backbone(f).Slope() : 0.0;
         const std::size_t row = m_flows.flows[f].Rows()[0];
         m_soft[f] = now;
         if (now > 0.0) compliance[row] = now;

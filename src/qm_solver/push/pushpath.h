@@ -55,16 +55,22 @@ public:
     /// The set of loads that grows from here on, the sets before it standing as they are.
     /// control: watch number of the control displacement; none: controlled by the load factor.
     T_FAULT BeginStage(std::size_t set, std::optional<std::size_t> control);
+    enum class WAY { On, None, Fault };
     /// Answers of the structure anew, after another factorisation; the state stays.
     T_FAULT Renew();
     /// So many flows are active that a factorisation with what has yielded pays.
     bool WantsFold() const;
     /// Takes the flows that harden into the elastic structure, as springs in series: they need no
     /// column and no row of the small system any more, until they turn. Selects must follow.
-    T_FAULT Fold();
+    T_FAULT Fold() { return FoldThose(true); }
+    /// Where Select finds no way on: displaces the control (that of BeginStage) to `control`, lets
+    /// give way what is beyond its strength then, and comes to a state in which every condition
+    /// holds again. Nothing is said of the way between. None: there is no such state.
+    WAY Leap(double control, T_FAULT& fault);
+    /// No force is beyond what its hinge carries, none that flows below.
+    bool IsAdmitted();
 
-    /// Finds who flows next and the rates. 1 done; 0 there is no way on.
-    enum class WAY { On, None, Fault };
+    /// Finds who flows next and the rates.
     WAY Select(T_FAULT& fault);
     void SetDrive(T_PUSH_DRIVE drive) { m_drive = std::move(drive); }
     const T_PUSH_RATE& Rate() const { return m_rate; }
@@ -138,6 +144,20 @@ private:
     {
         return m_flows.backbones[m_flows.flows[flow].backbone];
     }
+    // pushleap.cpp
+    double Excess(std::size_t flow);
+    T_FAULT FindWorst(double close, std::size_t& worst);
+    WAY Give(std::size_t flow, T_FAULT& fault);
+    void NoteLeap(std::span<const CHingeBackbone> before);
+    struct T_BEFORE {
+        std::vector<double> factors, plastic;
+        std::vector<CHingeBackbone> backbones;
+    };
+    T_FAULT Restore(T_BEFORE before);
+    WAY Settle(double control, T_FAULT& fault);
+    // pushfold.cpp
+    T_FAULT FoldThose(bool folds);
+    T_FAULT Unfold() { return FoldThose(false); }
     // pushpath.cpp
     /// Rate of the loads as that of the elastic forces that they make; 0 in a mechanism.
     double LoadRate() const;

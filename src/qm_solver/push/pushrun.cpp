@@ -32,9 +32,9 @@ bool Differ(std::span<const double> a, std::span<const double> b)
 bool IsWanted(PUSH_OUTCOME outcome)
 {
     constexpr PUSH_OUTCOME kWanted[] = {
-        PUSH_OUTCOME::Reached,       PUSH_OUTCOME::DriftStop, PUSH_OUTCOME::PeakFractionStop,
-        PUSH_OUTCOME::StiffnessStop, PUSH_OUTCOME::MarkStop,  PUSH_OUTCOME::StrengthLossStop,
-        PUSH_OUTCOME::LastPointStop};
+        PUSH_OUTCOME::Reached,       PUSH_OUTCOME::DriftStop,     PUSH_OUTCOME::PeakFractionStop,
+        PUSH_OUTCOME::StiffnessStop, PUSH_OUTCOME::MarkStop,      PUSH_OUTCOME::StrengthLossStop,
+        PUSH_OUTCOME::LastPointStop, PUSH_OUTCOME::ReachedByLeaps};
     return std::find(std::begin(kWanted), std::end(kWanted), outcome) != std::end(kWanted);
 }
 
@@ -304,6 +304,13 @@ CPushRun::T_FAULT CPushRun::Follow(const T_PUSH_STAGE& stage, int number, T_PUSH
             m_path->SetDrive({T_PUSH_DRIVE::KIND::Before, 1.0, {}});
             continue;
         }
+        if (found == CPushPath::WAY::None && number >= 0 && stage.leaps &&
+            stage.control == PUSH_CONTROL::Displacement) {
+            const CPushPath::WAY lept = Leap(stage, number, end, fault);
+            if (lept == CPushPath::WAY::Fault) return fault;
+            if (m_cancelled) return finish(end.outcome);
+            if (lept == CPushPath::WAY::On) continue;
+        }
         if (found == CPushPath::WAY::None || (byLoad && !m_path->LoadGrows()))
             return finish(byLoad ? PUSH_OUTCOME::NoEquilibrium : PUSH_OUTCOME::NoPath);
         if (stage.control == PUSH_CONTROL::Displacement && m_path->IsElsewhere())
@@ -368,7 +375,7 @@ CPushRun::T_FAULT CPushRun::Follow(const T_PUSH_STAGE& stage, int number, T_PUSH
         if (!byLoad && m_sign * (m_start - Present(stage)) > mostBack)
             return finish(PUSH_OUTCOME::SnapBack);
     }
-    return finish(PUSH_OUTCOME::Reached);
+    return finish(m_hasLept ? PUSH_OUTCOME::ReachedByLeaps : PUSH_OUTCOME::Reached);
 }
 
 const T_PUSH_STATE* CPushRun::StateOf(const T_PUSH_STEP& step) const

@@ -41,5 +41,6 @@ std::vector<std::string> PDeltaTexts()
 
 std::vector<std::string> FailureTexts()
 {
-    return KeyTexts({"IDS_QM_UI_FAILURE_DROP", "IDS_QM_UI_FAILURE_STOP"})();
+    return KeyTexts(
+        {"IDS_QM_UI_FAILURE_DROP", "IDS_QM_UI_FAILURE_STOP", "IDS_QM_UI_FAILURE_LEAP"})();
 }
