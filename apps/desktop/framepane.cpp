@@ -43,10 +43,10 @@ const char* KindKey(S::KIND kind)
 
 } // namespace
 
-CFramePane::CFramePane(CFrameScene& scene, QWidget* parent)
-    : QWidget(parent), m_scene(scene), m_view(new CFrameView(this)), m_source(new QComboBox(this)),
-      m_slider(new QSlider(Qt::Horizontal, this)), m_step(new QLabel(this)),
-      m_scaleLabel(new QLabel(this)), m_sourceLabel(new QLabel(this)),
+CFramePane::CFramePane(CDBDoc& doc, CFrameScene& scene, QWidget* parent)
+    : QWidget(parent), m_scene(scene), m_hinges(doc), m_view(new CFrameView(this)),
+      m_source(new QComboBox(this)), m_slider(new QSlider(Qt::Horizontal, this)),
+      m_step(new QLabel(this)), m_scaleLabel(new QLabel(this)), m_sourceLabel(new QLabel(this)),
       m_scaleEdit(new QLineEdit(this))
 {
     m_scaleEdit->setMaximumWidth(90);
@@ -101,7 +101,8 @@ void CFramePane::Refresh()
         for (const S& source : m_sources)
             m_source->addItem(NameOf(source));
         const auto it = std::ranges::find_if(m_sources, [&](const S& source) {
-            return source.kind == chosen.kind && source.key == chosen.key;
+            return source.kind == chosen.kind && source.key == chosen.key &&
+                   source.turn == chosen.turn;
         });
         m_source->setCurrentIndex(it == m_sources.end() ? 0
                                                         : static_cast<int>(it - m_sources.begin()));
@@ -167,6 +168,7 @@ void CFramePane::ShowStep()
             MMSGFunction::Format("IDS_QM_UI_SHAPE_NOTE", {scale, picture.scene->lengthUnit});
     picture.scale = m_scale;
     picture.drifts = m_scene.Drifts(source, step);
+    picture.marks = m_hinges.Marks(source, step, *picture.scene);
     m_step->setText(source.steps > 0 ? QStringLiteral("%1 / %2").arg(step).arg(source.steps)
                                      : QString());
     if (!m_scaleEdit->isModified()) m_scaleEdit->setText(QString::fromStdString(scale));

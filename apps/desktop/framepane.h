@@ -13,8 +13,8 @@ class QSlider;
 
 class CFramePane : public QWidget {
 public:
-    /// The scene must outlive the pane.
-    CFramePane(CFrameScene& scene, QWidget* parent = nullptr);
+    /// Document and scene must outlive the pane.
+    CFramePane(CDBDoc& doc, CFrameScene& scene, QWidget* parent = nullptr);
 
     /// The document has changed: frame, sources and shape again; the choice stays where it can.
     void Refresh();
@@ -37,6 +37,7 @@ private:
     void TakeScale();
 
     CFrameScene& m_scene;
+    CShownHinges m_hinges;
     std::vector<T_SHAPE_SOURCE> m_sources;
     std::vector<std::array<double, 3>> m_moves;
     bool m_ownScale = false; // typed by the person

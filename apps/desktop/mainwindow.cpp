@@ -77,7 +77,7 @@ CMainWindow::~CMainWindow()
 
 void CMainWindow::MakePanes()
 {
-    m_framePane = new CFramePane(m_scene, this);
+    m_framePane = new CFramePane(m_doc, m_scene, this);
     setCentralWidget(m_framePane);
     m_explorer = new CExplorerPane(
         m_doc, m_view, [this] { Refresh(); }, this);

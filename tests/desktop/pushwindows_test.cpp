@@ -265,6 +265,38 @@ TEST_F(PushWindows, PointsBeyondACancelledPushAreWithoutValues)
     EXPECT_GT(beyond, 0U);
 }
 
+TEST_F(PushWindows, TheFrameShowsTheHingesOfEachDirection)
+{
+    CDBDoc& doc = m_main->Doc();
+    int key = 0;
+    T_POLC_D record; // in current units, as an edit takes it
+    ASSERT_TRUE(doc.Attr().FindPolc("PX_HINGES", key) && doc.Attr().GetPolc(key, record));
+    record.control->generateStaticAngle = true;
+    record.control->staticAngle = 180.0;
+    {
+        CEditScope edit(doc, "Push it backwards");
+        ASSERT_TRUE(edit.Put(key, record) && edit.Commit());
+    }
+    PushIt();
+    CFramePane& frame = m_main->Frame();
+    const auto source = std::ranges::find(frame.Sources(), "PX_HINGES@180", &T_SHAPE_SOURCE::name);
+    ASSERT_NE(frame.Sources().end(), source);
+    ASSERT_TRUE(frame.Show(*source, source->steps));
+    const T_PUSH_RUN run = Stored("PX_HINGES@180");
+    const T_HINGE_MARKS* marks = frame.View().Picture().marks;
+    ASSERT_NE(nullptr, marks);
+    ASSERT_EQ(run.hinges.size(), marks->hinges.size());
+    std::size_t yielded = 0;
+    for (std::size_t i = 0; i < run.hinges.size(); ++i) {
+        EXPECT_EQ(run.hinges[i].state.back(), marks->hinges[i].state);
+        yielded += run.hinges[i].state.back() != PUSH_STATE::Elastic ? 1 : 0;
+    }
+    EXPECT_GT(yielded, 0U);
+    frame.SetStep(1);
+    for (const T_HINGE_MARK& mark : frame.View().Picture().marks->hinges)
+        EXPECT_EQ(PUSH_STATE::Elastic, mark.state);
+}
+
 TEST_F(PushWindows, AtOnceTheModelIsPushedAndItsHingesShown)
 {
     CPlay play({{kStates,

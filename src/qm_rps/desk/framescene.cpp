@@ -1,6 +1,7 @@
 #include "qm_rps/desk/framescene.h"
 
 #include "qm_base/say.h"
+#include "qm_rps/push/pushresultlist.h"
 
 #include <algorithm>
 #include <cmath>
@@ -126,6 +127,25 @@ const T_FRAME_SCENE& CFrameScene::SceneOf(const T_SHAPE_SOURCE& source)
     return stage;
 }
 
+/// Every load case that has steps, and every direction of its static angle that has.
+void CFrameScene::AddPushes(std::vector<T_SHAPE_SOURCE>& sources)
+{
+    CPostCtrl& post = m_doc.Post();
+    std::vector<T_PUSH_RESULT_ID> results = PushResultsOf(m_doc);
+    for (const auto& [key, push] : m_doc.Data().Model().pushovers)
+        if (HasImportedSteps(m_doc, key)) results.push_back({key, 0, push.name});
+    std::ranges::sort(results, {},
+                      [](const T_PUSH_RESULT_ID& id) { return std::pair(id.key, id.turn); });
+    for (const T_PUSH_RESULT_ID& id : results) {
+        std::string why;
+        if (!post.SelectPushover(id.key, id.turn) || post.GetStepCount() == 0) continue;
+        const bool old = post.IsStale(id.key, why, id.turn);
+        sources.push_back({S::KIND::Pushover, id.key,
+                           old ? Say("IDS_QM_UI_PUSH_OLD_NAME", id.name) : id.name,
+                           post.GetStepCount(), id.turn});
+    }
+}
+
 std::vector<T_SHAPE_SOURCE> CFrameScene::Sources()
 {
     const T_MODEL& model = m_doc.Data().Model();
@@ -136,14 +156,7 @@ std::vector<T_SHAPE_SOURCE> CFrameScene::Sources()
     if (!model.stages.empty() && post.CheckStagedResult())
         for (const auto& [key, stage] : model.stages)
             sources.push_back({S::KIND::Stage, key, stage.name, stage.steps});
-    for (const auto& [key, push] : model.pushovers)
-        if (post.SelectPushover(key)) {
-            std::string why;
-            sources.push_back(
-                {S::KIND::Pushover, key,
-                 post.IsStale(key, why) ? Say("IDS_QM_UI_PUSH_OLD_NAME", push.name) : push.name,
-                 post.GetStepCount()});
-        }
+    AddPushes(sources);
     for (const auto& entry : model.modes)
         sources.push_back({S::KIND::Mode, entry.first, std::to_string(entry.first), 0});
     return sources;
@@ -200,11 +213,12 @@ int CFrameScene::ReadSeries(int key)
     return 1;
 }
 
-int CFrameScene::ReadPushover(int key, int step, T_MOVES& out)
+int CFrameScene::ReadPushover(const T_SHAPE_SOURCE& source, int step, T_MOVES& out)
 {
+    const int key = source.key;
     const auto push = m_doc.Data().Model().pushovers.find(key);
     if (push == m_doc.Data().Model().pushovers.end() || step < 1) return 0;
-    if (IPushRun* const run = m_doc.Post().RunOf(key)) {
+    if (IPushRun* const run = m_doc.Post().RunOf(key, source.turn)) {
         std::vector<T_DOF6> shape;
         if (run->ReadShape(step, shape)) {
             out = MovesOf(m_scene, run->NodeIds(), shape, m_doc.Unit().Units());
@@ -235,7 +249,7 @@ int CFrameScene::Read(const T_SHAPE_SOURCE& source, int step, T_MOVES& out)
         post.SelectStage(source.key, step, kStageLoadSum);
         return ReadNodes([&](int node, T_DOF6& v) { return post.GetDspcNew(node, v); }, out);
     case S::KIND::Pushover:
-        return ReadPushover(source.key, step, out);
+        return ReadPushover(source, step, out);
     case S::KIND::Mode: {
         if (!post.SelectMode(source.key)) return 0;
         return ReadNodes(
@@ -257,7 +271,7 @@ std::vector<T_SCENE_DRIFT> CFrameScene::Drifts(const T_SHAPE_SOURCE& source, int
     std::vector<T_SCENE_DRIFT> out;
     std::vector<T_STOREY_DRIFT> drifts;
     if (source.kind != S::KIND::Pushover ||
-        !m_doc.Post().GetPushoverStoryDrifts(source.key, step, drifts))
+        !m_doc.Post().GetPushoverStoryDrifts(source.key, step, drifts, source.turn))
         return out;
     const auto& storeys = m_doc.Data().Model().storeys;
     double base = std::numeric_limits<double>::infinity();

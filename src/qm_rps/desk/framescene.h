@@ -33,6 +33,7 @@ struct T_SHAPE_SOURCE {
     int key = 0; // of the load case, stage or pushover load case; the mode's number
     std::string name;
     int steps = 0; // of a stage or pushover load case; else 0
+    int turn = 0;  // of a pushover load case: so many times its static angle
     bool operator==(const T_SHAPE_SOURCE&) const = default;
 };
 
@@ -79,7 +80,8 @@ public:
 private:
     using T_MOVES = std::vector<std::array<double, 3>>;
     void Build();
-    int ReadPushover(int key, int step, T_MOVES& out);
+    void AddPushes(std::vector<T_SHAPE_SOURCE>& sources);
+    int ReadPushover(const T_SHAPE_SOURCE& source, int step, T_MOVES& out);
     int ReadSeries(int key);
     template <class F>
     int ReadNodes(F read, T_MOVES& out);

@@ -34,3 +34,22 @@ void ShowStates(const T_PUSH_RUN& run, int step, long chosen, T_HINGE_MARKS& mar
         marks.hinges[i].chosen = static_cast<long>(i) == chosen;
     }
 }
+
+const T_HINGE_MARKS* CShownHinges::Marks(const T_SHAPE_SOURCE& source, int step,
+                                         const T_FRAME_SCENE& scene)
+{
+    if (source.kind != T_SHAPE_SOURCE::KIND::Pushover) return nullptr;
+    const long revision = m_doc.Data().Revision();
+    if (m_revision != revision || m_key != source.key || m_turn != source.turn) {
+        m_revision = revision;
+        m_key = source.key;
+        m_turn = source.turn;
+        m_run = {};
+        std::string why; // said where the results are read; here they are left out
+        if (!CPushRun(m_doc).Read(source.key, source.turn, m_run, why)) m_run = {};
+        m_marks = PlaceHinges(m_run, scene, m_doc.Data().Model());
+    }
+    if (m_marks.hinges.empty() || step < 1 || step > std::ssize(m_run.loadFactor)) return nullptr;
+    ShowStates(m_run, step, -1, m_marks);
+    return &m_marks;
+}

@@ -24,3 +24,21 @@ struct T_HINGE_MARKS {
 T_HINGE_MARKS PlaceHinges(const T_PUSH_RUN& run, const T_FRAME_SCENE& scene, const T_MODEL& model);
 /// The states of a step, from 1.
 void ShowStates(const T_PUSH_RUN& run, int step, long chosen, T_HINGE_MARKS& marks);
+
+/// The hinges of the push that the frame is shown under. The document must outlive the object.
+class CShownHinges {
+public:
+    explicit CShownHinges(CDBDoc& doc) : m_doc(doc) {}
+
+    /// The states of a step, from 1; valid until the next call. Null: the source is no push of our
+    /// own, or its results are older than the model, which then does not know the states.
+    const T_HINGE_MARKS* Marks(const T_SHAPE_SOURCE& source, int step, const T_FRAME_SCENE& scene);
+
+private:
+    CDBDoc& m_doc;
+    // What was read last.
+    long m_revision = -1;
+    int m_key = 0, m_turn = 0;
+    T_PUSH_RUN m_run;
+    T_HINGE_MARKS m_marks;
+};
