@@ -17,6 +17,7 @@ protected:
         pushes[0]["control"]["generate_static_angle"] = true;
         pushes[0]["control"]["static_angle"] = 90;
         json evaluation = file["evaluations"][0];
+        file["pushover_control"]["steps"] = 50; // too few: drops of strength fall between them
         file["evaluations"] = json::array();
         for (const char* const push : {"P", "PY", "P@90"}) {
             evaluation["name"] = std::string("of ") + push;
@@ -58,6 +59,8 @@ TEST_F(PushTurns, EveryDirectionIsEvaluated)
     EXPECT_EQ("of P, P@180", all[1].at("name"));
     ExpectSame(all[0], all[3]); // 90 degrees from X is Y
     ExpectSame(all[4], all[3]);
+    EXPECT_EQ(all[3].at("messages"), all[0].at("messages"));
+    ExpectHolds(all[0].at("messages").dump(), {"miss a vertex"});
     EXPECT_NE(all[0]["limit_states"][0]["demand"], all[1]["limit_states"][0]["demand"]);
     const auto at = [](const char* angle) { // the sign itself stands for an example's name
         return std::string("$(printf 'P\\100") + angle + "')";

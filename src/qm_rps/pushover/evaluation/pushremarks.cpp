@@ -217,11 +217,11 @@ void CRemarks::OnParticipation()
 // the line through these misses a vertex is counted in the plane of the whole curve, 1 by 1.
 void CRemarks::OnSteps()
 {
-    int key = 0;
     T_MISSED_VERTEX worst;
-    if (!m_doc.Attr().FindPolc(m_result.eval.push, key)) return;
-    IPushRun* const run = m_doc.Post().RunOf(key);
-    const int node = m_doc.Data().Model().pushovers.at(key).controlNode;
+    const auto push = FindPush(m_doc.Data().Model(), m_result.eval.push);
+    if (!push) return;
+    IPushRun* const run = m_doc.Post().RunOf(push->key, push->turn);
+    const int node = m_doc.Data().Model().pushovers.at(push->key).controlNode;
     if (!run || !FindMissedVertex(*run, node, worst) || !(worst.share > kMissedVertex)) return;
     const T_UNITS& units = m_result.units;
     const int direction = m_result.loadCase.direction;
