@@ -160,19 +160,49 @@ std::string CPushCollector::PlaceWords(const solver::T_PUSH_END& end, int storey
     return Say("IDS_QM_PUSH_ADVICE_STOREY", m_storeys[static_cast<std::size_t>(storey - 1)].name);
 }
 
-T_PUSH_RUN CPushCollector::Finish(const solver::T_PUSH_END& end, int storey)
+/// Measured as the case is controlled. A drop of strength passes its vertices on the way back.
+bool CPushCollector::IsBeyondLastStep(const T_PUSH_EVENT_ROW& event) const
 {
+    if (event.initial) return false;
+    if (m_run.loadFactor.empty()) return true;
+    if (m_case.stages.back().control == solver::PUSH_CONTROL::LoadFactor)
+        return event.loadFactor > m_run.loadFactor.back() * (1.0 + kSameDisplacement);
+    const double last = m_run.displacement.back() - m_run.startDisplacement;
+    return (event.displacement - m_run.startDisplacement) * last >
+           last * last * (1.0 + kSameDisplacement);
+}
+
+/// The engine hands on steps in blocks, and vertices as it passes them: of a run that was broken
+/// off it has told vertices that no step leads to.
+void CPushCollector::EndAtLastStep()
+{
+    const auto beyond = std::ranges::find_if(
+        m_run.events, [this](const T_PUSH_EVENT_ROW& event) { return IsBeyondLastStep(event); });
+    m_run.events.erase(beyond, m_run.events.end());
+    m_run.data.events.resize(m_run.events.size());
+}
+
+T_PUSH_RUN CPushCollector::Finish(solver::T_PUSH_END end, int storey)
+{
+    const bool broken = end.outcome == solver::PUSH_OUTCOME::Cancelled ||
+                        end.outcome == solver::PUSH_OUTCOME::OutOfBalance;
+    if (broken && !m_run.loadFactor.empty()) {
+        end.loadFactor = m_run.loadFactor.back();
+        end.displacement = m_run.displacement.back();
+    }
     if (end.drift >= 0 && end.drift < std::ssize(m_driftStorey))
         storey = m_driftStorey[static_cast<std::size_t>(end.drift)];
     m_run.cancelled = end.outcome == solver::PUSH_OUTCOME::Cancelled;
     m_run.status = StatusOf(end.outcome);
     m_run.outcome = PushOutcomeName(end.outcome);
-    m_run.advice = PushOutcomeAdvice(end.outcome, end.loadFactor, PlaceWords(end, storey));
+    m_run.advice = PushOutcomeAdvice(end.outcome, end.loadFactor, PlaceWords(end, storey),
+                                     !m_run.loadFactor.empty());
     if (end.stage + 1 < m_case.stages.size() && end.outcome != solver::PUSH_OUTCOME::InitialLoads) {
         m_run.status = PUSH_STATUS::Failed;
         m_run.advice = Say("IDS_QM_PUSH_ADVICE_EARLIER") + " " + m_run.advice;
     }
     m_recorder.End(end, storey);
     m_run.data = m_recorder.Take();
+    if (broken) EndAtLastStep();
     return std::move(m_run);
 }

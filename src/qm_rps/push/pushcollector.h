@@ -16,19 +16,21 @@ public:
     {
         std::ranges::copy(factors, m_factors.begin());
     }
-    /// True: the step is one of the case.
     /// The state before the first step of a stage.
     void Start(const solver::T_PUSH_STEP& step);
+    /// True: the step is one of the case.
     bool Take(const solver::T_PUSH_STEP& step);
     void Take(const solver::T_PUSH_EVENT& event);
     const T_PUSH_RUN& SoFar() const { return m_run; }
     /// storey: whose drift ended it, from 1, where the end does not tell (0).
-    T_PUSH_RUN Finish(const solver::T_PUSH_END& end, int storey = 0);
+    T_PUSH_RUN Finish(solver::T_PUSH_END end, int storey = 0);
 
 private:
     static T_RUN_HEAD HeadOf(const T_PUSH_CASE& c);
     double Along(const solver::T_VEC6& v) const;
     bool IsEvaluated(double displacement) const;
+    bool IsBeyondLastStep(const T_PUSH_EVENT_ROW& event) const;
+    void EndAtLastStep();
     void TakeStoreys(const solver::T_PUSH_STEP& step);
     std::string HingeWords(long hinge) const;
     std::string PlaceWords(const solver::T_PUSH_END& end, int storey) const;

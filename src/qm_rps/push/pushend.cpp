@@ -67,8 +67,13 @@ std::string PushOutcomeText(solver::PUSH_OUTCOME outcome)
 }
 
 std::string PushOutcomeAdvice(solver::PUSH_OUTCOME outcome, double loadFactor,
-                              const std::string& place)
+                              const std::string& place, bool hasSteps)
 {
-    const std::string text = Say(RowOf(outcome).advice, FormatText("%.6g", loadFactor));
+    const char* key = RowOf(outcome).advice;
+    if (!hasSteps && outcome == solver::PUSH_OUTCOME::Cancelled)
+        key = "IDS_QM_PUSH_ADVICE_CANCELLED_FIRST";
+    if (!hasSteps && outcome == solver::PUSH_OUTCOME::OutOfBalance)
+        key = "IDS_QM_PUSH_ADVICE_BALANCE_FIRST";
+    const std::string text = Say(key, FormatText("%.6g", loadFactor));
     return place.empty() ? text : text + " " + place;
 }

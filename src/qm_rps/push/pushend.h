@@ -16,6 +16,6 @@ std::string PushOutcomeName(solver::PUSH_OUTCOME outcome);
 std::string PushStatusText(PUSH_STATUS status);
 std::string PushOutcomeText(solver::PUSH_OUTCOME outcome);
 /// What it means and what to look at, in the chosen language. loadFactor: of the end; place: the
-/// hinge or storey that ended it, a sentence, may be empty.
+/// hinge or storey that ended it, a sentence, may be empty; hasSteps: the case has stored steps.
 std::string PushOutcomeAdvice(solver::PUSH_OUTCOME outcome, double loadFactor,
-                              const std::string& place);
+                              const std::string& place, bool hasSteps = true);
