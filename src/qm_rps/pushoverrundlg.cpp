@@ -50,12 +50,13 @@ std::string CPushOverRunDlg::CaseText(std::size_t row, std::size_t column) const
     const auto record = m_doc.Data().Model().pushovers.find(key);
     if (record == m_doc.Data().Model().pushovers.end()) return {};
     if (column == 0) return record->second.name;
-    const auto has = [key](const T_PUSH_RESULT_ID& id) { return id.key == key; };
-    std::string why;
     if (HasImportedSteps(m_doc, key)) return Say("IDS_QM_UI_PUSH_RUN_IMPORTED");
-    if (std::ranges::none_of(PushResultsOf(m_doc), has)) return Say("IDS_QM_UI_PUSH_RUN_NONE");
-    return Say(m_doc.Post().IsStale(key, why) ? "IDS_QM_UI_PUSH_RUN_OLD"
-                                              : "IDS_QM_UI_PUSH_RUN_CURRENT");
+    const std::vector<T_PUSH_RESULT_ID> results = PushResultsOf(m_doc);
+    const auto own = std::ranges::find(results, key, &T_PUSH_RESULT_ID::key);
+    if (own == results.end()) return Say("IDS_QM_UI_PUSH_RUN_NONE");
+    std::string why;
+    return Say(m_doc.Post().IsStale(key, why, own->turn) ? "IDS_QM_UI_PUSH_RUN_OLD"
+                                                         : "IDS_QM_UI_PUSH_RUN_CURRENT");
 }
 
 void CPushOverRunDlg::OnChoose(std::size_t row, bool chosen)

@@ -5,20 +5,28 @@
 #include "qm_db/recordfacts.h"
 #include "qm_rps/push/pushcases.h"
 #include "qm_rps/push/pushquantity.h"
+#include "qm_rps/push/pushresultlist.h"
 
 namespace {
 
-/// Displacement of the control at the last step (SI), along the direction of a turned push.
-double LastDisplacement(IPushRun& run, int controlNode)
+/// Displacement of the control at the last step, along its direction; SI.
+double LastDisplacement(IPushRun& run)
 {
     std::vector<T_RUN_STEP> steps;
-    std::vector<T_DOF6> moved;
-    if (!run.ReadSteps(steps) || steps.empty()) return run.Head().end.displacement;
-    if (run.Head().turn == 0 || !run.ReadNode(controlNode, moved)) return steps.back().displacement;
-    double along = 0.0;
-    for (std::size_t d = 0; d < 6; ++d)
-        along += run.Head().control[d] * moved.back()[d];
-    return along;
+    return run.ReadSteps(steps) && !steps.empty() ? steps.back().displacement
+                                                  : run.Head().end.displacement;
+}
+
+/// In a load case that this one starts from. The present ones tell nothing of a run that is older
+/// than they are.
+bool EndedEarlier(CDBDoc& doc, int key, int turn, IPushRun& run)
+{
+    std::vector<int> chain;
+    std::string unused;
+    return run.StepCount() == 0 && run.Head().end.outcome != solver::PUSH_OUTCOME::InitialLoads &&
+           !doc.Post().IsStale(key, unused, turn) &&
+           PushChainOf(doc.Data().Model(), key, chain, unused) &&
+           run.Head().end.stage + 1 < std::ssize(chain);
 }
 
 } // namespace
@@ -26,19 +34,13 @@ double LastDisplacement(IPushRun& run, int controlNode)
 std::optional<T_PUSH_ENDED> PushEndedOf(CDBDoc& doc, int key, int turn)
 {
     IPushRun* const run = doc.Post().RunOf(key, turn);
-    const auto record = doc.Data().Model().pushovers.find(key);
-    if (!run || record == doc.Data().Model().pushovers.end()) return std::nullopt;
+    if (!run) return std::nullopt;
     const T_RUN_END& end = run->Head().end;
     T_PUSH_ENDED out{StatusOf(end.outcome), end.outcome, false, 0.0, {}};
-    std::vector<int> chain;
-    std::string unknown;
-    out.earlier = end.outcome != solver::PUSH_OUTCOME::InitialLoads &&
-                  PushChainOf(doc.Data().Model(), key, chain, unknown) &&
-                  end.stage + 1 < std::ssize(chain);
+    out.earlier = EndedEarlier(doc, key, turn, *run);
     if (out.earlier) out.status = PUSH_STATUS::Failed;
-    const T_PUSH_QUANTITY length =
-        DisplacementIn(static_cast<std::size_t>(record->second.direction - 1), doc.Unit().Units());
-    out.displacement = length.Shown(LastDisplacement(*run, record->second.controlNode));
+    const T_PUSH_QUANTITY length = DisplacementIn(DirectionOf(run->Head()), doc.Unit().Units());
+    out.displacement = length.Shown(LastDisplacement(*run));
     out.unit = length.Unit();
     return out;
 }

@@ -31,6 +31,13 @@ void ReadStart(const T_POLC_D& record, T_PUSH_RUN& run)
 
 } // namespace
 
+std::size_t DirectionOf(const T_RUN_HEAD& head)
+{
+    const auto largest =
+        std::ranges::max_element(head.control, {}, [](double c) { return std::fabs(c); });
+    return static_cast<std::size_t>(largest - head.control.begin());
+}
+
 bool HasImportedSteps(CDBDoc& doc, int key)
 {
     const T_RESULT_MAP& results = doc.Data().Content().results;
@@ -71,10 +78,7 @@ int ReadOldRun(CDBDoc& doc, const T_PUSH_RESULT_ID& id, T_PUSH_RUN& out, std::st
     run.name = id.name;
     run.key = id.key;
     run.turn = id.turn;
-    const T_DOF6& control = run.data.head.control;
-    const auto largest =
-        std::ranges::max_element(control, {}, [](double c) { return std::fabs(c); });
-    run.direction = static_cast<std::size_t>(largest - control.begin());
+    run.direction = DirectionOf(run.data.head);
     run.status = StatusOf(run.data.head.end.outcome);
     run.outcome = PushOutcomeName(run.data.head.end.outcome);
     for (const T_RUN_STEP& step : run.data.steps) {

@@ -13,6 +13,9 @@ struct T_PUSH_RESULT_ID {
 /// Those of our own, by the keys of the load cases.
 std::vector<T_PUSH_RESULT_ID> PushResultsOf(CDBDoc& doc);
 
+/// The axis nearest to the direction of control that the run had: 0 to 5.
+std::size_t DirectionOf(const T_RUN_HEAD& head);
+
 /// Steps of another solver can't be had again from the model: no push puts its own in their place
 /// unless it is told to.
 bool HasImportedSteps(CDBDoc& doc, int key);
