@@ -68,7 +68,7 @@ struct T_BENCH {
     {
         NeedBenchApp();
         doc.Data().Assign(Content());
-        pane = std::make_unique<CFramePane>(scene);
+        pane = std::make_unique<CFramePane>(doc, scene);
         pane->resize(1000, 760);
         pane->show();
         QApplication::processEvents();
