@@ -14,6 +14,7 @@ struct T_HINGE_OPTIONS {
     std::string end;                         // "I" or "J"; empty: the first page
     std::string to;                          // "ddy" or "plastic"
     std::string elements;                    // "1,2,5-9"
+    std::string axialCase;                   // assign: static load case; empty: the initial loads
     std::string out;                         // file to write: .json, .qmdb or a picture
     bool overwrite = false;                  // a file that is there
     bool interaction = false;                // plot: interaction instead of the backbone

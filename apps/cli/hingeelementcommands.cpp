@@ -28,8 +28,18 @@ std::string DeformText(const T_PHGT_D& type, HINGE_COMPONENT c, std::optional<do
 struct T_YIELD_OF {
     const T_PHGT_D& type;
     const T_HINGE_ELEMENT& in;
+    CHingeGenerator::T_STRENGTHS strengths;
     T_UNITS units;
 };
+
+/// The page that holds an end's strengths.
+HINGE_END PageOf(const T_HINGE_COMPONENT& c, HINGE_LOCATION end)
+{
+    const bool both = !NeedsIJPages(c) && c.location != HINGE_LOCATION::IEnd &&
+                      c.location != HINGE_LOCATION::JEnd;
+    if (both) return HINGE_END::Both;
+    return end == HINGE_LOCATION::IEnd ? HINGE_END::I : HINGE_END::J;
+}
 
 /// One curve at one end: strengths and deformations at first yield of both sides, "-" where there
 /// is no method. False when an automatic strength could not be calculated.
@@ -40,8 +50,9 @@ bool PrintYieldCurve(const T_YIELD_OF& of, std::size_t i, HINGE_LOCATION end,
     const T_THETA_LOOKUP lookup =
         LookupOf(of.type, of.in.section ? &*of.in.section : nullptr,
                  of.in.material ? &*of.in.material : nullptr, of.in.memberLength);
-    const T_SIDE_VALUES yield =
-        PageStrength(curve, of.type.components[i].type, c, *of.in.result).yield;
+    const T_SIDE_VALUES yield = PageStrength(curve, of.type.components[i].type, c,
+                                             of.strengths.at(PageOf(of.type.components[i], end)))
+                                    .yield;
     const T_SIDE_VALUES deform = PageDeform(curve, c, end, lookup, yield);
     const auto* fema = std::get_if<T_SKEL_FEMA>(&curve);
     const char* source = IsAutoYield(curve)         ? "IDS_QM_CLI_HINGE_AUTOMATIC"
@@ -86,9 +97,14 @@ bool PrintYield(const CHingeGenerator& generator, const T_PHGE_D& hinge, const T
                   in.section ? FormatText("%.6g", in.memberLength) : "-"));
     if (!type.length.autoSpan)
         PrintLine("  " + Say("IDS_QM_CLI_HINGE_OWN_SPAN", FormatText("%.6g", type.length.span)));
+    T_YIELD_OF of{type, in, {}, units};
+    if (!generator.CalcStrengths(type, hinge.element, hinge.axialCase, in, of.strengths, refusal)) {
+        PrintLine("  " + refusal.text);
+        return false;
+    }
     bool whole = true;
     for (std::size_t i = 0; i < type.components.size(); ++i)
-        if (type.components[i].active) whole &= PrintYieldComponent({type, in, units}, i);
+        if (type.components[i].active) whole &= PrintYieldComponent(of, i);
     if (!whole && in.result->fault != SECT_FAULT::None)
         PrintLine("  " + Say(MessageKeyOf(in.result->fault)));
     return whole;
@@ -179,7 +195,11 @@ EXIT_CODE RunHingeAssign(const T_HINGE_OPTIONS& o)
     if (!elements || elements->empty())
         return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_ELEMENT_LIST", o.elements));
     T_HINGE_REFUSAL refusal;
-    if (!CHingeGenerator(doc).Generate(key, *elements, refusal))
+    int axialCase = 0;
+    if (!o.axialCase.empty() && !doc.Attr().FindStld(o.axialCase, axialCase))
+        return Complain(EXIT_CODE::Usage,
+                        o.file + ": " + Say("IDS_QM_DB_RESULT_NO_CASE", o.axialCase));
+    if (!CHingeGenerator(doc).Generate(key, *elements, refusal, axialCase))
         return Complain(EXIT_CODE::BadInput, o.file + ": " + refusal.text);
     if (const EXIT_CODE code = SaveDocument(doc, o.out); code != EXIT_CODE::Done) return code;
     PrintLine(Say("IDS_QM_CLI_HINGE_ASSIGNED",

@@ -49,6 +49,7 @@ void AddHingeCommands(CLI::App& app, EXIT_CODE& code)
                " --type \"steel beam\" --elements 2,3 -o assigned.json", o, RunHingeAssign);
     type(assign, true);
     assign->add_option("--elements", o->elements, Say("IDS_QM_HELP_HINGE_ELEMENTS"))->required();
+    assign->add_option("--axial-case", o->axialCase, Say("IDS_QM_HELP_HINGE_AXIAL_CASE"));
     assign->add_option("-o", o->out, Say("IDS_QM_HELP_TO_WRITE"))->required();
     AddOverwrite(assign, o->overwrite);
     AddOne(hinges, "generated", Say("IDS_QM_HELP_HINGE_GENERATED"), "", o, RunHingeGenerated);

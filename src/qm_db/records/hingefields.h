@@ -356,6 +356,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_PHGE_D> r)
     v.Part("yield", r.yield);
     v.Part("crack_J", r.crackJ);
     v.Part("yield_J", r.yieldJ);
+    v.OptRef("axial_case", r.axialCase, KindOf<T_STLD_D>());
 }
 
 template <class V>

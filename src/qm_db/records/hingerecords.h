@@ -232,6 +232,9 @@ struct T_PHGE_D {
     std::array<T_SIDES<double>, 6> crack{}, yield{}; // strengths by component
     /// Those of the J-end of components whose ends have curves of their own; else 0.
     std::array<T_SIDES<double>, 6> crackJ{}, yieldJ{};
+    /// Static load case (key) whose axial force automatic moments were taken at; 0: the initial
+    /// loads of the global control.
+    int axialCase = 0;
     bool operator==(const T_PHGE_D&) const = default;
 };
 

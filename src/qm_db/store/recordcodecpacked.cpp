@@ -50,6 +50,7 @@ void PackedLists(V& v, auto& key, H& h)
     v.List("yield", LIST::Always, h.yield);
     v.List("crack_J", LIST::UnlessZero, h.crackJ);
     v.List("yield_J", LIST::UnlessZero, h.yieldJ);
+    v.List("axial_case", LIST::UnlessZero, h.axialCase);
 }
 
 // ---- writing and reading them -------------------------------------------------------------------

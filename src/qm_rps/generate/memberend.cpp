@@ -1,7 +1,6 @@
 #include "qm_rps/generate/memberend.h"
 
 #include "qm_base/say.h"
-#include "qm_db/analysisrun.h"
 #include "qm_db/sectionproperties.h"
 #include "qm_rps/push/pushstoreys.h"
 
@@ -90,38 +89,6 @@ void AppendSection(const T_SECT_D& s, std::vector<double>& to)
 }
 
 } // namespace
-
-int CInitialAxial::Analyse(const T_MODEL& model, std::string& reason)
-{
-    const std::vector<T_PUSH_INITIAL_LOAD>& loads = model.pushControl.initialLoads;
-    m_isLoaded = !loads.empty();
-    if (!m_isLoaded) return 1;
-    T_ANALYSIS_OPTIONS options;
-    options.allCases = options.stages = false;
-    for (const T_PUSH_INITIAL_LOAD& load : loads)
-        options.cases.push_back(load.loadCase);
-    T_ANALYSIS_RESULTS results;
-    T_ANALYSIS_ERROR error;
-    if (!CAnalysisRun::Compute(model, options, nullptr, results, error))
-        return Refuse(reason, error.text);
-    for (const T_PUSH_INITIAL_LOAD& load : loads)
-        for (const auto& entry : model.elements) {
-            T_ELEM_FORCES forces;
-            const auto found = results.cases.find(load.loadCase);
-            if (found == results.cases.end() || !found->second->ReadForces(entry.first, forces))
-                continue; // a spring has none
-            T_ENDS<double>& axial = m_axial[entry.first];
-            axial.I -= load.factor * forces.front()[0];
-            axial.J -= load.factor * forces.back()[0];
-        }
-    return 1;
-}
-
-T_ENDS<double> CInitialAxial::Of(int element) const
-{
-    const auto found = m_axial.find(element);
-    return found == m_axial.end() ? T_ENDS<double>{} : found->second;
-}
 
 int ReadMember(const T_MODEL& model, int element, const CInitialAxial& axial, T_RC_MEMBER& out,
                std::string& reason)

@@ -4,6 +4,7 @@
 
 #include "qm_db/dbdoc.h"
 #include "qm_rps/generate/rchinge.h"
+#include "qm_rps/hinge/axial/initialaxial.h"
 
 /// One element. Steeper than 45 degrees it is a column, else a beam.
 struct T_RC_MEMBER {
@@ -13,19 +14,6 @@ struct T_RC_MEMBER {
     T_ENDS<double> axial{};               // compression positive
     std::vector<HINGE_COMPONENT> bending; // about which axes
     T_ENDS<T_DIRS6> release{};
-};
-
-/// Axial forces of the initial loads of the global control, by linear analysis.
-class CInitialAxial {
-public:
-    /// 1 done; 0 with the reason in words. Without initial loads every force is 0.
-    [[nodiscard]] int Analyse(const T_MODEL& model, std::string& reason);
-    bool IsLoaded() const { return m_isLoaded; }
-    T_ENDS<double> Of(int element) const;
-
-private:
-    std::map<int, T_ENDS<double>> m_axial;
-    bool m_isLoaded = false;
 };
 
 /// Columns bend about y and z, beams about y; in a plane model each about the axis that is normal

@@ -3,6 +3,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_db/editscope.h"
+#include "qm_rps/hinge/hingechoices.h"
 #include "qm_rps/hinge/hingelabels.h"
 #include "qm_rps/hinge/hingetable.h"
 #include "qm_rps/hinge/hingetypefindings.h"
@@ -13,7 +14,7 @@
 namespace {
 
 using zql::lib::MMSGFunction;
-using T_STRENGTHS = std::array<T_SIDES<double>, 6>;
+using T_BY_COMPONENT = std::array<T_SIDES<double>, 6>;
 
 /// why: in place of the text of the key.
 int Refuse(int element, const std::string& key, T_HINGE_REFUSAL& refusal, std::string why = {})
@@ -54,6 +55,28 @@ bool KindFits(HINGE_ELEMENT type, HINGE_ELEMENT element)
     return (type == HINGE_ELEMENT::Wall ? HINGE_ELEMENT::BeamColumn : type) == element;
 }
 
+/// The moments of a component at an axial force, compression positive, in place of those without.
+int PutMoments(const T_HINGE_ELEMENT& e, const T_UNITS& units, HINGE_COMPONENT c, double axial,
+               CHingeSources::T_RESULT& result, T_HINGE_REFUSAL& refusal)
+{
+    std::optional<T_SIDES<double>>& moments = result.strength.yield[static_cast<std::size_t>(c)];
+    if (axial == 0.0 || !moments) return 1;
+    for (const bool positive : {true, false}) {
+        SECT_FAULT fault{};
+        if (CSectionStrength::CalcMoment(*e.section, *e.material, units, c == HINGE_COMPONENT::My,
+                                         positive, axial, positive ? moments->pos : moments->neg,
+                                         fault))
+            continue;
+        refusal.key = "IDS_QM_HINGE_AXIAL_BEYOND";
+        refusal.why = MMSGFunction::Format(refusal.key,
+                                           {HingeHead(FormatText("%.6g", axial), kDimForce, units),
+                                            FormatText("%.6g", -result.strength.level.tension),
+                                            FormatText("%.6g", result.strength.level.compression)});
+        return 0;
+    }
+    return 1;
+}
+
 bool Differ(double stored, double today)
 {
     constexpr double kDigits = 1e-6; // a case file may state its strengths in so many digits
@@ -61,7 +84,7 @@ bool Differ(double stored, double today)
 }
 
 /// Appends the strengths that differ, "My(+) 300, now 280".
-void Compare(const std::string& prefix, const T_STRENGTHS& stored, const T_STRENGTHS& today,
+void Compare(const std::string& prefix, const T_BY_COMPONENT& stored, const T_BY_COMPONENT& today,
              std::string& out)
 {
     for (std::size_t i = 0; i < stored.size(); ++i)
@@ -76,12 +99,31 @@ void Compare(const std::string& prefix, const T_STRENGTHS& stored, const T_STREN
         }
 }
 
+/// The moment is calculated, and no curve gives it by the axial force while pushed.
+bool HangsOnInitialAxial(const T_PHGT_D& type, HINGE_COMPONENT c)
+{
+    const HINGE_INTERACTION interaction = InteractionOf(type, c);
+    const T_HINGE_COMPONENT& component = At(type, c);
+    if (!component.active || interaction == HINGE_INTERACTION::PMM ||
+        interaction == HINGE_INTERACTION::User)
+        return false;
+    bool hangs = false;
+    ForEachPage(component, [&](HINGE_END, const T_SKEL_CURVE& curve) {
+        const auto* fema = std::get_if<T_SKEL_FEMA>(&curve);
+        hangs |= IsAutoYield(curve) && !(fema && fema->multiCurve);
+    });
+    return hangs;
+}
+
+constexpr HINGE_COMPONENT kBending[] = {HINGE_COMPONENT::My, HINGE_COMPONENT::Mz};
+
 /// The strengths of a component with those of the other pages: the J-end's own ones apart.
-void PutStrengths(const T_HINGE_COMPONENT& c, std::size_t i, const CHingeSources::T_RESULT& result,
-                  T_PHGE_D& hinge)
+void PutStrengths(const T_HINGE_COMPONENT& c, std::size_t i,
+                  const CHingeGenerator::T_STRENGTHS& results, T_PHGE_D& hinge)
 {
     const bool two = NeedsIJPages(c);
     ForEachPage(c, [&](HINGE_END end, const T_SKEL_CURVE& curve) {
+        const CHingeSources::T_RESULT& result = results.at(end);
         const T_PAGE_STRENGTH s =
             PageStrength(curve, c.type, static_cast<HINGE_COMPONENT>(i), result);
         const bool j = two && end == HINGE_END::J;
@@ -126,8 +168,8 @@ int CHingeGenerator::ReadElement(const T_PHGT_D& type, int element, T_HINGE_ELEM
     return 1;
 }
 
-int CHingeGenerator::CalcHinge(int hingeType, int element, T_PHGE_D& out,
-                               T_HINGE_REFUSAL& refusal) const
+int CHingeGenerator::CalcHinge(int hingeType, int element, T_PHGE_D& out, T_HINGE_REFUSAL& refusal,
+                               int axialCase) const
 {
     T_PHGT_D type;
     T_HINGE_ELEMENT e;
@@ -144,14 +186,55 @@ int CHingeGenerator::CalcHinge(int hingeType, int element, T_PHGE_D& out,
     T_PHGE_D hinge;
     hinge.element = element;
     hinge.hingeType = hingeType;
+    hinge.axialCase = axialCase;
+    T_STRENGTHS results;
+    if (!CalcStrengths(type, element, axialCase, e, results, refusal)) return 0;
     for (std::size_t i = 0; i < type.components.size(); ++i)
-        if (type.components[i].active) PutStrengths(type.components[i], i, *e.result, hinge);
+        if (type.components[i].active) PutStrengths(type.components[i], i, results, hinge);
     out = hinge;
     return 1;
 }
 
+int CHingeGenerator::CalcStrengths(const T_PHGT_D& type, int element, int axialCase,
+                                   const T_HINGE_ELEMENT& e, T_STRENGTHS& out,
+                                   T_HINGE_REFUSAL& refusal) const
+{
+    T_STRENGTHS results;
+    for (const HINGE_END end : {HINGE_END::I, HINGE_END::J, HINGE_END::Both})
+        results[end] = *e.result;
+    for (const HINGE_COMPONENT c : kBending) {
+        T_ENDS<double> axial;
+        if (!HangsOnInitialAxial(type, c)) continue;
+        if (!AxialOf(axialCase, element, axial, refusal)) return 0;
+        const std::pair<HINGE_END, double> at[] = {{HINGE_END::I, axial.I},
+                                                   {HINGE_END::J, axial.J},
+                                                   {HINGE_END::Both, 0.5 * (axial.I + axial.J)}};
+        for (const auto& [end, force] : at)
+            if (!PutMoments(e, m_context.units, c, force, results[end], refusal))
+                return Refuse(element, refusal.key, refusal, refusal.why);
+    }
+    out = std::move(results);
+    return 1;
+}
+
+/// In the document's current units.
+int CHingeGenerator::AxialOf(int axialCase, int element, T_ENDS<double>& out,
+                             T_HINGE_REFUSAL& refusal) const
+{
+    const auto [at, fresh] = m_axial.try_emplace(axialCase);
+    std::string reason;
+    if (fresh && !at->second.Analyse(m_doc.Data().Model(), reason, axialCase)) {
+        m_axial.erase(at);
+        return Refuse(element, "IDS_QM_HINGE_NO_AXIAL", refusal,
+                      MMSGFunction::Format("IDS_QM_HINGE_NO_AXIAL", {reason}));
+    }
+    const T_ENDS<double> axial = at->second.Of(element);
+    out = {m_doc.Unit().Out(axial.I, kDimForce), m_doc.Unit().Out(axial.J, kDimForce)};
+    return 1;
+}
+
 int CHingeGenerator::Generate(int hingeType, const std::vector<int>& elements,
-                              T_HINGE_REFUSAL& refusal)
+                              T_HINGE_REFUSAL& refusal, int axialCase)
 {
     if (elements.empty()) return Refuse(0, "IDS_CMD_IEHP_NO_ELEM", refusal);
     if (T_PHGT_D type; m_doc.Attr().GetPhgt(hingeType, type)) {
@@ -163,7 +246,7 @@ int CHingeGenerator::Generate(int hingeType, const std::vector<int>& elements,
     }
     std::map<int, T_PHGE_D> fresh; // by element
     for (const int element : elements)
-        if (!CalcHinge(hingeType, element, fresh[element], refusal)) return 0;
+        if (!CalcHinge(hingeType, element, fresh[element], refusal, axialCase)) return 0;
 
     std::set<int> extra;
     std::map<int, int> keys; // of the hinges that are replaced, by element
@@ -214,7 +297,8 @@ std::string CHingeGenerator::StaleText(const T_PHGE_D& hinge) const
     T_PHGE_D today;
     T_HINGE_REFUSAL refusal;
     std::string text;
-    if (!HasStrengths(hinge) || !CalcHinge(hinge.hingeType, hinge.element, today, refusal))
+    if (!HasStrengths(hinge) ||
+        !CalcHinge(hinge.hingeType, hinge.element, today, refusal, hinge.axialCase))
         return text;
     Compare("", hinge.yield, today.yield, text);
     Compare("", hinge.crack, today.crack, text);
@@ -225,7 +309,7 @@ std::string CHingeGenerator::StaleText(const T_PHGE_D& hinge) const
 
 bool CHingeGenerator::HasStrengths(const T_PHGE_D& hinge)
 {
-    const T_STRENGTHS none{};
+    const T_BY_COMPONENT none{};
     return hinge.yield != none || hinge.crack != none || hinge.yieldJ != none ||
            hinge.crackJ != none;
 }
