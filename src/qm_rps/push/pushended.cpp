@@ -6,6 +6,9 @@
 #include "qm_rps/push/pushcases.h"
 #include "qm_rps/push/pushquantity.h"
 #include "qm_rps/push/pushresultlist.h"
+#include "qm_solver/pushresult.h"
+
+#include <algorithm>
 
 namespace {
 
@@ -15,6 +18,19 @@ double LastDisplacement(IPushRun& run)
     std::vector<T_RUN_STEP> steps;
     return run.ReadSteps(steps) && !steps.empty() ? steps.back().displacement
                                                   : run.Head().end.displacement;
+}
+
+/// Where the first leap has led to; SI.
+double FirstLeap(IPushRun& run)
+{
+    std::vector<T_RUN_EVENT> events;
+    if (!run.ReadEvents(events)) return LastDisplacement(run);
+    const auto leaps = [](const T_RUN_EVENT& event) {
+        return std::ranges::find(event.turns, solver::HINGE_TURN::Leap, &T_RUN_TURN::turn) !=
+               event.turns.end();
+    };
+    const auto first = std::ranges::find_if(events, leaps);
+    return first == events.end() ? LastDisplacement(run) : first->displacement;
 }
 
 /// In a load case that this one starts from. The present ones tell nothing of a run that is older
@@ -40,7 +56,8 @@ std::optional<T_PUSH_ENDED> PushEndedOf(CDBDoc& doc, int key, int turn)
     out.earlier = EndedEarlier(doc, key, turn, *run);
     if (out.earlier) out.status = PUSH_STATUS::Failed;
     const T_PUSH_QUANTITY length = DisplacementIn(DirectionOf(run->Head()), doc.Unit().Units());
-    out.displacement = length.Shown(LastDisplacement(*run));
+    const bool lept = end.outcome == solver::PUSH_OUTCOME::ReachedByLeaps;
+    out.displacement = length.Shown(lept ? FirstLeap(*run) : LastDisplacement(*run));
     out.unit = length.Unit();
     return out;
 }

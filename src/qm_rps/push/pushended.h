@@ -12,7 +12,8 @@ struct T_PUSH_ENDED {
     PUSH_STATUS status = PUSH_STATUS::Failed;
     solver::PUSH_OUTCOME outcome{};
     bool earlier = false;      // already in a load case that this one starts from
-    double displacement = 0.0; // of the control at the last step, in current units
+    double displacement = 0.0; // of the control at the last step (of a push with leaps, behind the
+                               // first of them), in current units
     std::string unit;          // of the displacement
 };
 
