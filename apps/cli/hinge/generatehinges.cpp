@@ -13,6 +13,7 @@
 
 namespace {
 
+constexpr HINGE_DEFINITION kMeasure = HINGE_DEFINITION::MomentRotation;
 using T_TABLE_ROWS = std::vector<std::vector<std::string>>;
 
 /// Columns under their heads, numbers to the right, the last one to the left.
@@ -36,22 +37,34 @@ std::string Number(double value)
     return FormatText("%.5g", value);
 }
 
-/// a, b, c, IO, LS, CP as plastic rotations; theta_y, DL, SD, NC as chord rotations.
-void AppendBackbone(const T_CODE_BACKBONE& bone, bool chord, std::vector<std::string>& cells)
+/// a, b, c, IO, LS, CP as plastic deformations; theta_y, DL, SD, NC as total ones.
+void AppendBackbone(const T_CODE_BACKBONE& bone, bool chord, T_DIM dim, const T_UNITS& units,
+                    std::vector<std::string>& cells)
 {
-    const std::array<double, 3> levels = bone.acceptance.value_or(std::array<double, 3>{});
+    const auto put = [&](double value) { cells.push_back(Number(FromSi(value, units, dim))); };
     if (chord) {
-        cells.push_back(Number(bone.yieldDeform));
+        put(bone.yieldDeform);
     } else {
-        cells.push_back(Number(bone.Plastic(bone.C.deform)));
-        cells.push_back(Number(bone.Plastic(bone.E.deform)));
+        put(bone.Plastic(bone.C.deform));
+        put(bone.Plastic(bone.E.deform));
         cells.push_back(Number(bone.D.strength));
     }
-    for (const double level : levels)
-        cells.push_back(Number(chord ? level : bone.Plastic(level)));
+    for (const double level : bone.acceptance.value_or(std::array<double, 3>{}))
+        put(chord ? level : bone.Plastic(level));
 }
 
-std::vector<std::string> Heads(bool chord, const T_UNITS& units)
+/// Moments alone: "M (kN m)"; else "F, M (kN, kN m)".
+std::string StrengthHead(const T_CODE_HINGES& hinges, const T_UNITS& units)
+{
+    const std::string moment = UnitText(kDimMoment, units);
+    for (const T_CODE_ELEMENT& element : hinges.elements)
+        for (const T_CODE_COMPONENT& c : element.hinge->components)
+            if (c.component < HINGE_COMPONENT::Mx)
+                return "F, M (" + UnitText(kDimForce, units) + ", " + moment + ")";
+    return "M (" + moment + ")";
+}
+
+std::vector<std::string> Heads(const T_CODE_HINGES& hinges, bool chord, const T_UNITS& units)
 {
     const std::string force(NameOf(units.force));
     std::vector<std::string> heads{Say("IDS_QM_CLI_ELEMENT"),
@@ -59,7 +72,7 @@ std::vector<std::string> Heads(bool chord, const T_UNITS& units)
                                    Say("IDS_QM_GEN_AXIS"),
                                    "+/-",
                                    "N (" + force + ")",
-                                   "M (" + UnitText(kDimMoment, units) + ")",
+                                   StrengthHead(hinges, units),
                                    "V/Vn"};
     const std::vector<std::string> more =
         chord ? std::vector<std::string>{"theta_y", "DL", "SD", "NC"}
@@ -71,7 +84,7 @@ std::vector<std::string> Heads(bool chord, const T_UNITS& units)
 
 std::string Table(const T_CODE_HINGES& hinges, bool chord, const T_UNITS& units)
 {
-    T_TABLE_ROWS table{Heads(chord, units)};
+    T_TABLE_ROWS table{Heads(hinges, chord, units)};
     for (const T_CODE_ELEMENT& element : hinges.elements)
         for (const T_CODE_ROW_OF_HINGE& row : HingeRows(element)) {
             std::vector<std::string>& cells = table.emplace_back();
@@ -80,9 +93,10 @@ std::string Table(const T_CODE_HINGES& hinges, bool chord, const T_UNITS& units)
                      kComponentNames[static_cast<std::size_t>(row.component)],
                      row.side,
                      Number(FromSi(row.axial, units, kDimForce)),
-                     Number(FromSi(row.of->moment, units, kDimMoment)),
-                     Number(row.of->shear / row.of->shearStrength)};
-            AppendBackbone(row.of->bone, chord, cells);
+                     Number(FromSi(row.of->strength, units, StrengthDim(row.component))),
+                     row.of->shearStrength > 0.0 ? Number(row.of->shear / row.of->shearStrength)
+                                                 : "-"};
+            AppendBackbone(row.of->bone, chord, DeformDim(row.component, kMeasure), units, cells);
             cells.push_back(element.hinge->type.name);
         }
     return TableText(table);

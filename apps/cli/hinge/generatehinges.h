@@ -1,4 +1,4 @@
-// Hinges of reinforced concrete members as a code gives them.
+// Hinges of members as a code gives them.
 #pragma once
 
 #include "exitcodes.h"

@@ -32,19 +32,23 @@ void WriteTrace(CJsonText& w, const std::vector<T_CODE_TRACE>& trace, const T_UN
     w.End();
 }
 
-/// Total deformations in rad; strengths over the yield strength.
-void WriteBackbone(CJsonText& w, const T_CODE_BACKBONE& bone)
+/// Total deformations, rotations in rad; strengths over the yield strength.
+void WriteBackbone(CJsonText& w, const T_CODE_BACKBONE& bone, HINGE_COMPONENT component,
+                   const T_UNITS& units)
 {
+    const T_DIM dim = DeformDim(component, HINGE_DEFINITION::MomentRotation);
+    const auto shown = [&](double deform) { return FromSi(deform, units, dim); };
     w.Key("backbone").Object(kJsonOneLine);
-    w.Member("yield_rotation", bone.yieldDeform);
+    w.Member(IsBending(component) ? "yield_rotation" : "yield_displacement",
+             shown(bone.yieldDeform));
     const std::pair<const char*, const T_CODE_POINT*> points[] = {
         {"B", &bone.B}, {"C", &bone.C}, {"D", &bone.D}, {"E", &bone.E}};
     for (const auto& [name, point] : points)
-        w.Items(name, std::array{point->deform, point->strength}, kJsonOneLine);
+        w.Items(name, std::array{shown(point->deform), point->strength}, kJsonOneLine);
     const bool chord = bone.levels == CODE_LEVELS::DlSdNc;
     const auto names = chord ? std::array{"DL", "SD", "NC"} : std::array{"IO", "LS", "CP"};
     for (std::size_t i = 0; bone.acceptance && i < names.size(); ++i)
-        w.Member(names[i], (*bone.acceptance)[i]);
+        w.Member(names[i], shown((*bone.acceptance)[i]));
     w.End();
 }
 
@@ -55,10 +59,13 @@ void WriteHinge(CJsonText& w, const T_CODE_ROW_OF_HINGE& row, const T_UNITS& uni
     w.Beside().Member("end", row.end);
     w.Beside().Member("side", row.side);
     w.Member("axial", FromSi(row.axial, units, kDimForce));
-    w.Member("moment", FromSi(row.of->moment, units, kDimMoment));
-    w.Member("shear", FromSi(row.of->shear, units, kDimForce));
-    w.Member("shear_strength", FromSi(row.of->shearStrength, units, kDimForce));
-    WriteBackbone(w, row.of->bone);
+    w.Member(IsBending(row.component) ? "moment" : "force",
+             FromSi(row.of->strength, units, StrengthDim(row.component)));
+    if (row.of->shearStrength > 0.0) {
+        w.Member("shear", FromSi(row.of->shear, units, kDimForce));
+        w.Member("shear_strength", FromSi(row.of->shearStrength, units, kDimForce));
+    }
+    WriteBackbone(w, row.of->bone, row.component, units);
     WriteTrace(w, row.of->trace, units);
     WriteWarnings(w, row.of->warnings);
     w.End();
@@ -87,7 +94,7 @@ std::string CodeHingesJson(const T_CODE_HINGES& hinges, const std::string& code,
             if (element.hinge.get() == hinge) ids.push_back(element.member.element);
         w.Object();
         w.Member("name", hinge->type.name);
-        w.Member("member", first.member.column ? "column" : "beam");
+        w.Member("member", kMemberKindNames[static_cast<std::size_t>(first.member.kind)]);
         w.Member("clear_length", FromSi(first.member.clear, units, kDimLength));
         w.Items("elements", ids, kJsonOneLine);
         WriteWarnings(w, hinge->warnings);

@@ -91,3 +91,15 @@ std::optional<T_ACI_SHEAR> AciShear(const T_SHEAR_SECTION& s, double lambda, CCo
     v.Vn = sheet.Put("Vn", v.concrete + v.hoops, kDimForce, kAci, "Vc + Vs", R);
     return sheet.Sound() ? std::optional(v) : std::nullopt;
 }
+
+std::optional<double> AciWallShear(double area, double fc, double fyt, double ratio,
+                                   CCodeSheet& sheet)
+{
+    constexpr const char* kClause = "ACI 318 18.10.4";
+    sheet.NotNegative({{"ratio", ratio}, {"fyt", fyt}});
+    if (!sheet.Positive({{"area", area}, {"fc", fc}})) return {};
+    const double root = RootPsi(fc);
+    sheet.Put("rho_t", ratio, kClause, "horizontal bars", CODE_MARK::Computed);
+    return sheet.Put("Vn", std::min(2.0 * root + ratio * fyt, 10.0 * root) * area, kDimForce,
+                     kClause, "(2 sqrt(f'c) + rho_t fyt) Acv <= 10 sqrt(f'c) Acv (psi)", R);
+}

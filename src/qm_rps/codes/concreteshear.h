@@ -32,3 +32,8 @@ struct T_ACI_SHEAR {
 /// ACI 318 22.5, normal weight: lambda = 1, else 0.75. With hoops or not: 318-19 takes the size
 /// effect into Vc where there are none.
 std::optional<T_ACI_SHEAR> AciShear(const T_SHEAR_SECTION& s, double lambda, CCodeSheet& sheet);
+
+/// ACI 318 18.10.4.1, slender walls (hw / lw >= 2): Vn = (2 sqrt(f'c) + rho_t fyt) Acv in psi, not
+/// above 10 sqrt(f'c) Acv. `ratio` is that of the horizontal bars.
+std::optional<double> AciWallShear(double area, double fc, double fyt, double ratio,
+                                   CCodeSheet& sheet);

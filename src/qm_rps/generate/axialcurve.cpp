@@ -13,7 +13,7 @@ namespace {
 constexpr double kWider = 1.0 + 1e-6; // rounding of a force must not choose among equal gaps
 constexpr double kRounding = 1e-9;    // of the largest moment: at its tips the curve has none
 
-std::optional<CSectionBending> BendingOf(const T_RC_END& end)
+std::optional<CSectionBending> BendingOf(const T_MEMBER_END& end)
 {
     CCodeSheet sheet;
     const std::optional<T_RC_MATERIAL> strengths = RcMaterial(end.material, end.code, sheet);
@@ -21,28 +21,6 @@ std::optional<CSectionBending> BendingOf(const T_RC_END& end)
     const double fc = std::min(strengths->fc / kPascalsPerMpa, kMaxFckMpa);
     return CSectionBending::Of(end.section, AssessedMaterial(end.material, *strengths),
                                ConcreteLaw(fc));
-}
-
-/// Axial forces of the points, falling; empty where the fixed ones are too many or not in order.
-std::vector<double> Forces(double compression, double balanced, double tension,
-                           const T_ENDS<double>& given, std::size_t count)
-{
-    const double same = 1e-6 * (compression - tension);
-    std::vector<double> forces{compression, tension};
-    for (const double force : {0.0, balanced, given.I, given.J})
-        if (std::ranges::all_of(forces, [&](double f) { return std::fabs(f - force) > same; }) &&
-            tension < force && force < compression)
-            forces.push_back(force);
-    std::ranges::sort(forces, std::greater());
-    while (forces.size() < count) {
-        std::size_t widest = 1;
-        for (std::size_t i = 2; i < forces.size(); ++i)
-            if (forces[i - 1] - forces[i] > kWider * (forces[widest - 1] - forces[widest]))
-                widest = i;
-        const double middle = 0.5 * (forces[widest - 1] + forces[widest]);
-        forces.insert(forces.begin() + static_cast<std::ptrdiff_t>(widest), middle);
-    }
-    return forces;
 }
 
 /// Moments over their largest; false: one is below 0 or was not found.
@@ -68,7 +46,35 @@ bool Fill(const CSectionBending& bending, const std::vector<double>& forces, CUR
 
 } // namespace
 
-std::optional<T_PMM_TABLE> AxialCurve(const std::vector<T_RC_END>& ends,
+std::vector<double> AxialForces(double compression, double tension,
+                                std::initializer_list<double> fixed, std::size_t count)
+{
+    const double same = 1e-6 * (compression - tension);
+    std::vector<double> forces{compression, tension};
+    for (const double force : fixed)
+        if (std::ranges::all_of(forces, [&](double f) { return std::fabs(f - force) > same; }) &&
+            tension < force && force < compression)
+            forces.push_back(force);
+    std::ranges::sort(forces, std::greater());
+    while (forces.size() < count) {
+        std::size_t widest = 1;
+        for (std::size_t i = 2; i < forces.size(); ++i)
+            if (forces[i - 1] - forces[i] > kWider * (forces[widest - 1] - forces[widest]))
+                widest = i;
+        const double middle = 0.5 * (forces[widest - 1] + forces[widest]);
+        forces.insert(forces.begin() + static_cast<std::ptrdiff_t>(widest), middle);
+    }
+    return forces;
+}
+
+void UseForBoth(T_PMM_TABLE& table, bool aboutY)
+{
+    const std::size_t used = aboutY ? 0 : 1;
+    table.curves[1 - used] = table.curves[used];
+    (*table.negative)[1 - used] = (*table.negative)[used];
+}
+
+std::optional<T_PMM_TABLE> AxialCurve(const std::vector<T_MEMBER_END>& ends,
                                       const T_ENDS<double>& given)
 {
     T_PMM_TABLE table;
@@ -82,20 +88,17 @@ std::optional<T_PMM_TABLE> AxialCurve(const std::vector<T_RC_END>& ends,
     if (!bending->At(2.0, compression) || !bending->At(0.0, tension) ||
         !bending->Largest(balanced, place) || !(tension.axial < 0.0))
         return {};
-    const std::vector<double> forces = Forces(compression.axial, balanced.axial, tension.axial,
-                                              given, table.curves.front().size());
+    const std::vector<double> forces =
+        AxialForces(compression.axial, tension.axial, {0.0, balanced.axial, given.I, given.J},
+                    table.curves.front().size());
     table.Pmax = compression.axial;
-    for (const T_RC_END& end : ends)
+    for (const T_MEMBER_END& end : ends)
         for (const bool positive : {true, false}) {
             const auto component = end.aboutY ? HINGE_COMPONENT::My : HINGE_COMPONENT::Mz;
             T_PMM_CURVES& curves = positive ? table.curves : *table.negative;
             bending->Turn(end.aboutY, positive != IsSectionSignOpposite(component));
             if (!Fill(*bending, forces, curves[end.aboutY ? 0 : 1])) return {};
         }
-    if (ends.size() == 1) { // the other axis has no hinge
-        const std::size_t used = ends.front().aboutY ? 0 : 1;
-        table.curves[1 - used] = table.curves[used];
-        (*table.negative)[1 - used] = (*table.negative)[used];
-    }
+    if (ends.size() == 1) UseForBoth(table, ends.front().aboutY);
     return table;
 }

@@ -5,12 +5,12 @@
 
 struct T_CODE_ROW_OF_HINGE {
     int element = 0;
-    bool column = false;
-    std::string end; // "I", "J"; "I, J": both are alike
+    MEMBER_KIND kind = MEMBER_KIND::Beam;
+    std::string end; // "I", "J"; "I, J": both are alike; "C": in the middle
     HINGE_COMPONENT component = HINGE_COMPONENT::My;
-    std::string side;              // "+", "-" by the signs of an analysis; "+-": both are alike
-    double axial = 0.0;            // SI, compression positive; of beams 0
-    const T_RC_SIDE* of = nullptr; // of the hinge, which outlives the row
+    std::string side;                // "+", "-" by the signs of an analysis; "+-": both are alike
+    double axial = 0.0;              // SI, compression positive; of beams 0
+    const T_CODE_SIDE* of = nullptr; // of the hinge, which outlives the row
 };
 std::vector<T_CODE_ROW_OF_HINGE> HingeRows(const T_CODE_ELEMENT& element);
 

@@ -23,11 +23,17 @@ T_HINGE_REFUSAL RefusalOf(int element, const std::string& reason)
     return {element, "", reason, text};
 }
 
-std::vector<int> BeamsOf(const T_MODEL& model)
+/// Beam elements, and trusses of steel.
+std::vector<int> MembersOf(const T_MODEL& model)
 {
     std::vector<int> ids;
-    for (const auto& [id, element] : model.elements)
-        if (element.kind == ELEM_KIND::Beam) ids.push_back(id);
+    for (const auto& [id, element] : model.elements) {
+        const auto material = model.materials.find(element.material);
+        const bool steel =
+            material != model.materials.end() && material->second.type == MATL_CLASS::Steel;
+        if (element.kind == ELEM_KIND::Beam || (element.kind == ELEM_KIND::Truss && steel))
+            ids.push_back(id);
+    }
     return ids;
 }
 
@@ -77,9 +83,9 @@ int CCodeHinges::Group(const T_CODE_REQUEST& request, std::vector<T_GROUP>& grou
         if (request.keepGoing) out.skipped.push_back(refusal);
         return request.keepGoing;
     };
-    const std::vector<int> ids = request.elements.empty() ? BeamsOf(model) : request.elements;
+    const std::vector<int> ids = request.elements.empty() ? MembersOf(model) : request.elements;
     for (const int id : ids) {
-        T_RC_MEMBER member;
+        T_HINGE_MEMBER member;
         std::string reason;
         if (!ReadMember(model, id, m_axial, member, reason)) {
             if (!refuse(id, reason)) return 0;
@@ -173,7 +179,7 @@ std::string CCodeHinges::FaultOf(int hingeType)
     if (code == kHingeCodeNames.end()) return Say("IDS_QM_GEN_CODE", type.generated->code);
     std::string reason;
     if (!Analyse(reason)) return Say("IDS_QM_GEN_NOT_CHECKED", reason);
-    T_RC_MEMBER member;
+    T_HINGE_MEMBER member;
     for (const int id : ElementsWithHingeType(model, hingeType)) {
         if (!ReadMember(model, id, m_axial, member, reason))
             return Say("IDS_QM_GEN_NOT_CHECKED",

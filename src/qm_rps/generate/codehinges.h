@@ -1,5 +1,5 @@
-// Hinges of reinforced concrete members as a code gives them: from section, bars and initial loads
-// to hinge types that members share and the hinges of elements.
+// Hinges of members as a code gives them: from section, bars and initial loads to hinge types that
+// members share and the hinges of elements.
 #pragma once
 
 #include "qm_rps/generate/codehingetype.h"
@@ -11,13 +11,13 @@
 struct T_CODE_REQUEST {
     HINGE_CODE code = HINGE_CODE::Asce17;
     bool secondary = false;
-    std::vector<int> elements; // empty: every beam element of the model
+    std::vector<int> elements; // empty: every beam element of the model, and trusses of steel
     bool keepGoing = false;    // leave out what can't have a hinge
 };
 
 /// The hinge of one element.
 struct T_CODE_ELEMENT {
-    T_RC_MEMBER member;
+    T_HINGE_MEMBER member;
     std::shared_ptr<const T_CODE_HINGE> hinge; // its type has the name
 };
 struct T_CODE_HINGES {

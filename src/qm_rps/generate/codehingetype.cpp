@@ -2,6 +2,8 @@
 
 #include "qm_base/say.h"
 #include "qm_rps/generate/axialcurve.h"
+#include "qm_rps/generate/rchinge.h"
+#include "qm_rps/generate/steelhinge.h"
 #include "qm_rps/push/lawaxial.h"
 
 #include <algorithm>
@@ -17,13 +19,14 @@ int Refuse(std::string& reason, std::string words)
 }
 
 /// By the signs of an analysis.
-const T_RC_SIDE& SideOf(const T_SIDES<T_RC_SIDE>& sides, HINGE_COMPONENT component, bool positive)
+const T_CODE_SIDE& SideOf(const T_SIDES<T_CODE_SIDE>& sides, HINGE_COMPONENT component,
+                          bool positive)
 {
     return positive != IsSectionSignOpposite(component) ? sides.pos : sides.neg;
 }
 
 /// One side of a curve in plastic deformations. A limit before yield counts at yield.
-T_SKEL_SIDE CurveSide(const T_RC_SIDE& from, bool positive, bool follows)
+T_SKEL_SIDE CurveSide(const T_CODE_SIDE& from, bool positive, bool follows)
 {
     const double sign = positive ? 1.0 : -1.0;
     const T_CODE_BACKBONE& bone = from.bone;
@@ -33,7 +36,7 @@ T_SKEL_SIDE CurveSide(const T_RC_SIDE& from, bool positive, bool follows)
         return T_SKEL_POINT{plastic(p.deform), sided(p.strength)};
     };
     T_SKEL_SIDE side;
-    side.yield = follows ? from.momentAtZero : from.moment;
+    side.yield = follows ? from.strengthAtZero : from.strength; // of shear and axial force the same
     side.yieldDeform = bone.yieldDeform;
     side.B = point(bone.B);
     side.C = point(bone.C);
@@ -47,7 +50,7 @@ T_SKEL_SIDE CurveSide(const T_RC_SIDE& from, bool positive, bool follows)
 }
 
 template <class CURVE>
-CURVE FilledCurve(const T_SIDES<T_RC_SIDE>& sides, HINGE_COMPONENT component, bool follows)
+CURVE FilledCurve(const T_SIDES<T_CODE_SIDE>& sides, HINGE_COMPONENT component, bool follows)
 {
     CURVE curve;
     curve.symmetric = false;
@@ -60,17 +63,17 @@ CURVE FilledCurve(const T_SIDES<T_RC_SIDE>& sides, HINGE_COMPONENT component, bo
     return curve;
 }
 
-T_SKEL_CURVE CurveOf(const T_SIDES<T_RC_SIDE>& sides, HINGE_COMPONENT component, bool follows,
+T_SKEL_CURVE CurveOf(const T_SIDES<T_CODE_SIDE>& sides, HINGE_COMPONENT component, bool follows,
                      bool chord)
 {
     if (chord) return FilledCurve<T_SKEL_EC8>(sides, component, follows);
     return FilledCurve<T_SKEL_FEMA>(sides, component, follows);
 }
 
-void WarnEarly(const T_SIDES<T_RC_SIDE>& sides, T_CODE_HINGE& hinge)
+void WarnEarly(const T_SIDES<T_CODE_SIDE>& sides, T_CODE_HINGE& hinge)
 {
     const T_CODE_WARNING early{"IDS_QM_GEN_WARN_EARLY", {}};
-    for (const T_RC_SIDE* side : {&sides.pos, &sides.neg}) {
+    for (const T_CODE_SIDE* side : {&sides.pos, &sides.neg}) {
         const auto& limits = side->bone.acceptance;
         const bool before = limits && (*limits)[1] < side->bone.yieldDeform;
         if (before && std::ranges::find(hinge.warnings, early) == hinge.warnings.end())
@@ -79,7 +82,7 @@ void WarnEarly(const T_SIDES<T_RC_SIDE>& sides, T_CODE_HINGE& hinge)
 }
 
 /// Where the component has hinges; none: both ends are released.
-std::optional<HINGE_LOCATION> LocationOf(const T_RC_MEMBER& member, HINGE_COMPONENT component)
+std::optional<HINGE_LOCATION> LocationOf(const T_HINGE_MEMBER& member, HINGE_COMPONENT component)
 {
     const auto at = static_cast<std::size_t>(component);
     const bool i = !member.release.I[at], j = !member.release.J[at];
@@ -88,47 +91,110 @@ std::optional<HINGE_LOCATION> LocationOf(const T_RC_MEMBER& member, HINGE_COMPON
     return j ? std::optional(HINGE_LOCATION::JEnd) : std::nullopt;
 }
 
+/// Sides of an end by what the member is made of.
+int EndHinge(const T_MEMBER_END& end, T_SIDES<T_CODE_SIDE>& out, std::string& reason)
+{
+    return end.material.type == MATL_CLASS::Steel ? SteelHinge(end, out, reason)
+                                                  : RcHinge(end, out, reason);
+}
+
+/// A hinge of shear in the middle where a side asks for one: the weaker end's.
+void AddShear(const T_CODE_COMPONENT& bending, T_CODE_HINGE& hinge)
+{
+    const auto& [I, J] = bending.ends;
+    T_CODE_COMPONENT shear;
+    shear.component =
+        bending.component == HINGE_COMPONENT::My ? HINGE_COMPONENT::Fz : HINGE_COMPONENT::Fy;
+    shear.location = HINGE_LOCATION::Center;
+    const T_CODE_SIDE* weakest = nullptr;
+    for (const T_CODE_SIDE* side : {&I.pos, &I.neg, &J.pos, &J.neg})
+        if (side->shearBone && (!weakest || side->shearBone->yield < weakest->shearBone->yield))
+            weakest = side;
+    if (!weakest) return;
+    T_CODE_SIDE side = *weakest;
+    side.bone = *side.shearBone;
+    side.strength = side.strengthAtZero = side.bone.yield;
+    shear.ends = {{side, side}, {side, side}};
+    hinge.components.push_back(std::move(shear));
+}
+
 /// The backbones of both ends about the axes that have hinges.
-int Bend(const T_MODEL& model, const T_RC_MEMBER& member, HINGE_CODE code, bool secondary,
+int Bend(const T_MODEL& model, const T_HINGE_MEMBER& member, HINGE_CODE code, bool secondary,
          T_CODE_HINGE& hinge, std::string& reason)
 {
     for (const HINGE_COMPONENT component : member.bending) {
-        if (!LocationOf(member, component)) continue;
-        T_CODE_BENDING bending;
+        const auto location = LocationOf(member, component);
+        if (!location) continue;
+        T_CODE_COMPONENT bending;
         bending.component = component;
-        const bool same = !member.column || member.axial.I == member.axial.J;
+        bending.location = *location;
+        const bool same = !member.HasAxial() || member.axial.I == member.axial.J;
         for (const bool atI : {true, false}) {
             if (!atI && same) {
                 bending.ends.J = bending.ends.I;
                 continue;
             }
-            const T_RC_END end = EndOf(model, member, code, secondary, component,
-                                       atI ? member.axial.I : member.axial.J);
-            if (!RcHinge(end, atI ? bending.ends.I : bending.ends.J, reason)) return 0;
+            const T_MEMBER_END end = EndOf(model, member, code, secondary, component,
+                                           atI ? member.axial.I : member.axial.J);
+            if (!EndHinge(end, atI ? bending.ends.I : bending.ends.J, reason)) return 0;
         }
         WarnEarly(bending.ends.I, hinge);
         WarnEarly(bending.ends.J, hinge);
-        hinge.bending.push_back(std::move(bending));
+        hinge.components.push_back(bending);
+        AddShear(bending, hinge);
     }
-    return hinge.bending.empty() ? Refuse(reason, Say("IDS_QM_PUSH_HINGE_RELEASED")) : 1;
+    return hinge.components.empty() ? Refuse(reason, Say("IDS_QM_PUSH_HINGE_RELEASED")) : 1;
 }
 
-void Fill(const T_RC_MEMBER& member, bool chord, bool follows, T_CODE_HINGE& hinge)
+/// The hinge of axial force of a brace.
+int Brace(const T_MODEL& model, const T_HINGE_MEMBER& member, HINGE_CODE code, bool secondary,
+          T_CODE_HINGE& hinge, std::string& reason)
+{
+    T_CODE_COMPONENT axial;
+    axial.component = HINGE_COMPONENT::Fx;
+    axial.location = HINGE_LOCATION::Center;
+    const T_MEMBER_END end =
+        EndOf(model, member, code, secondary, HINGE_COMPONENT::My, member.axial.I);
+    if (!SteelBrace(end, axial.ends.I, reason)) return 0;
+    axial.ends.J = axial.ends.I;
+    hinge.components.push_back(std::move(axial));
+    return 1;
+}
+
+void Fill(const T_HINGE_MEMBER& member, bool chord, T_CODE_HINGE& hinge)
 {
     T_PHGT_D& type = hinge.type;
-    for (const T_CODE_BENDING& b : hinge.bending) {
+    const bool follows = type.pmm.has_value();
+    for (const T_CODE_COMPONENT& b : hinge.components) {
         T_HINGE_COMPONENT& c = type.components[static_cast<std::size_t>(b.component)];
         c.active = true;
         c.type = chord ? SKEL_TYPE::Ec8 : SKEL_TYPE::Fema;
-        c.location = *LocationOf(member, b.component);
+        c.location = b.location;
         c.curves.I = CurveOf(b.ends.I, b.component, follows, chord);
         c.curves.J = CurveOf(b.ends.J, b.component, follows, chord);
         c.sameEnds = c.curves.I == c.curves.J;
-        if (!chord) continue;
+        if (!chord || !std::ranges::count(member.bending, b.component)) continue;
         T_ENDS<double>& length =
             b.component == HINGE_COMPONENT::My ? type.length.My : type.length.Mz;
         length = {b.ends.I.pos.hingeLength, b.ends.J.pos.hingeLength};
     }
+}
+
+/// The strengths of bending by axial force.
+void PutAxialCurve(const T_MODEL& model, const T_HINGE_MEMBER& member, HINGE_CODE code,
+                   bool secondary, T_CODE_HINGE& hinge)
+{
+    std::vector<T_MEMBER_END> ends;
+    for (const T_CODE_COMPONENT& b : hinge.components)
+        if (std::ranges::count(member.bending, b.component))
+            ends.push_back(EndOf(model, member, code, secondary, b.component, member.axial.I));
+    T_PHGT_D& type = hinge.type;
+    type.pmm = type.material == MATL_CLASS::Steel ? SteelAxialCurve(ends, member.axial)
+                                                  : AxialCurve(ends, member.axial);
+    if (type.pmm)
+        type.interaction = HINGE_INTERACTION::User;
+    else
+        hinge.warnings.push_back({"IDS_QM_GEN_WARN_NO_PM", {}});
 }
 
 /// The numbers that a generator fills.
@@ -170,27 +236,24 @@ private:
 
 } // namespace
 
-int MakeCodeHinge(const T_MODEL& model, const T_RC_MEMBER& member, HINGE_CODE code, bool secondary,
-                  T_CODE_HINGE& out, std::string& reason)
+int MakeCodeHinge(const T_MODEL& model, const T_HINGE_MEMBER& member, HINGE_CODE code,
+                  bool secondary, T_CODE_HINGE& out, std::string& reason)
 {
     T_CODE_HINGE hinge;
-    if (!Bend(model, member, code, secondary, hinge, reason)) return 0;
     T_PHGT_D& type = hinge.type;
-    type.material = MATL_CLASS::Concrete;
-    if (member.column) {
-        std::vector<T_RC_END> ends;
-        for (const T_CODE_BENDING& b : hinge.bending)
-            ends.push_back(EndOf(model, member, code, secondary, b.component, member.axial.I));
-        type.pmm = AxialCurve(ends, member.axial);
-        if (type.pmm)
-            type.interaction = HINGE_INTERACTION::User;
-        else
-            hinge.warnings.push_back({"IDS_QM_GEN_WARN_NO_PM", {}});
+    type.material = model.materials.at(member.material).type;
+    if (member.kind == MEMBER_KIND::Brace) {
+        if (!Brace(model, member, code, secondary, hinge, reason)) return 0;
+        if (model.elements.at(member.element).kind == ELEM_KIND::Truss)
+            type.element = HINGE_ELEMENT::Truss;
+    } else {
+        if (!Bend(model, member, code, secondary, hinge, reason)) return 0;
+        if (member.HasAxial()) PutAxialCurve(model, member, code, secondary, hinge);
     }
-    Fill(member, IsChordCode(code), type.pmm.has_value(), hinge);
+    Fill(member, IsChordCode(code), hinge);
     type.generated =
         T_GENERATED{kHingeCodeNames[static_cast<std::size_t>(code)], secondary,
-                    member.column ? member.axial : T_ENDS<double>{}, InputsOf(model, member)};
+                    member.HasAxial() ? member.axial : T_ENDS<double>{}, InputsOf(model, member)};
     out = std::move(hinge);
     return 1;
 }

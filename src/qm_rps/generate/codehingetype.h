@@ -3,24 +3,28 @@
 
 #include "qm_rps/generate/memberend.h"
 
-/// Both ends of a member, both sides of each, about one axis.
-struct T_CODE_BENDING {
+/// One component: both ends of a member, both sides of each. Hinges of shear and axial force stand
+/// in the middle, and both ends are alike.
+struct T_CODE_COMPONENT {
     HINGE_COMPONENT component = HINGE_COMPONENT::My;
-    T_ENDS<T_SIDES<T_RC_SIDE>> ends; // sides of the section: (+) compresses +z or +y
+    HINGE_LOCATION location = HINGE_LOCATION::BothEnds;
+    /// Bending: sides of the section, (+) compresses +z or +y. Axial: (+) tension.
+    T_ENDS<T_SIDES<T_CODE_SIDE>> ends;
 };
 
 struct T_CODE_HINGE {
-    std::vector<T_CODE_BENDING> bending;
+    std::vector<T_CODE_COMPONENT> components;
     T_PHGT_D type; // SI, without a name
     std::vector<T_CODE_WARNING> warnings;
 };
 
-/// The hinge of a member by a code. Of columns the strength follows the axial force along eleven
-/// points of the section's own curve, among them the forces of the initial loads; the type's yield
-/// strength is then the one without an axial force. Where the bars are so that bending without
-/// curvature has a moment, the curve is left out with a warning. A released end has no hinge.
+/// The hinge of a member by a code. Of columns and walls the strength follows the axial force along
+/// eleven points of the section's own curve (steel: of the code's formulas), among them the forces
+/// of the initial loads; the type's yield strength is then the one without an axial force. Where
+/// bars are so that bending without curvature has a moment, the curve is left out with a warning.
+/// A released end has no hinge.
 /// 1 done; 0 with the reason in words, `out` unchanged.
-[[nodiscard]] int MakeCodeHinge(const T_MODEL& model, const T_RC_MEMBER& member, HINGE_CODE code,
+[[nodiscard]] int MakeCodeHinge(const T_MODEL& model, const T_HINGE_MEMBER& member, HINGE_CODE code,
                                 bool secondary, T_CODE_HINGE& out, std::string& reason);
 
 /// The same but for rounding; names and keys of sections do not count.

@@ -2,6 +2,7 @@
 
 #include "qm_base/say.h"
 #include "qm_db/sectionproperties.h"
+#include "qm_rps/generate/rcmember.h"
 #include "qm_rps/push/pushstoreys.h"
 
 #include <algorithm>
@@ -11,7 +12,7 @@
 namespace {
 
 using T_VECTOR = std::array<double, 3>;
-constexpr double kSameAxial = 1e-6; // of Ag fc
+constexpr double kSameAxial = 1e-6; // of the squash load
 constexpr auto kMy = HINGE_COMPONENT::My, kMz = HINGE_COMPONENT::Mz;
 
 double Dot(const T_VECTOR& a, const T_VECTOR& b)
@@ -58,11 +59,54 @@ int Refuse(std::string& reason, std::string words)
     return 0;
 }
 
-/// Compressive strength of the concrete alone, the measure of axial forces.
+/// Local y and z, those of the section.
+HINGE_COMPONENT StrongAxis(const T_SECT_D& section)
+{
+    return section.size[0] >= section.size[1] ? kMy : kMz;
+}
+
+bool TurnsFreely(const T_ELEM_D& e, const std::vector<HINGE_COMPONENT>& bending)
+{
+    return std::ranges::all_of(bending, [&](HINGE_COMPONENT c) {
+        const auto at = static_cast<std::size_t>(c);
+        return e.release.I[at] && e.release.J[at];
+    });
+}
+
+/// What the member is, and about which axes it bends.
+void SetKind(const T_MODEL& model, const T_ELEM_D& e, const T_VECTOR& x, T_HINGE_MEMBER& m)
+{
+    const T_SECT_D& section = model.sections.at(e.section);
+    const MATL_CLASS material = model.materials.at(e.material).type;
+    const bool steep = std::fabs(x[VerticalAxis(model)]) > std::sqrt(0.5);
+    m.kind = steep ? MEMBER_KIND::Column : MEMBER_KIND::Beam;
+    if (material == MATL_CLASS::Masonry) m.kind = steep ? MEMBER_KIND::Pier : MEMBER_KIND::Spandrel;
+    m.bending = BendingOf(model, e, x, steep);
+    if (e.kind == ELEM_KIND::Truss ||
+        (material == MATL_CLASS::Steel && TurnsFreely(e, m.bending))) {
+        m.kind = MEMBER_KIND::Brace;
+        m.bending.clear();
+        return;
+    }
+    const HINGE_COMPONENT strong = StrongAxis(section);
+    const bool inPlane = std::ranges::count(m.bending, strong) > 0;
+    const bool wall =
+        material == MATL_CLASS::Concrete && steep && IsWallSection(section) && inPlane;
+    if (wall) m.kind = MEMBER_KIND::Wall;
+    if (wall || (m.kind == MEMBER_KIND::Pier && inPlane)) m.bending = {strong};
+}
+
+/// Compressive strength of concrete or masonry alone, or of steel: the measure of axial forces.
 double SquashLoad(const T_SECT_D& section, const T_MATL_D& material)
 {
-    const double fc = std::max(material.fck, material.mean.value_or(T_MATL_MEAN{}).fc);
-    return section.size[0] * section.size[1] * fc;
+    const T_MATL_MEAN mean = material.mean.value_or(T_MATL_MEAN{});
+    if (material.type == MATL_CLASS::Concrete && section.shape == SECT_SHAPE::Rectangle)
+        return section.size[0] * section.size[1] * std::max(material.fck, mean.fc);
+    T_SECT_D s;
+    SECT_FAULT fault = SECT_FAULT::None;
+    if (!CSectionProperties::Calc(section, s, fault)) return 0.0;
+    return s.area * (material.type == MATL_CLASS::Steel ? std::max(material.Fy, mean.fy)
+                                                        : std::max(material.fck, mean.fc));
 }
 
 void Append(std::vector<double>& to, std::initializer_list<double> values)
@@ -76,6 +120,7 @@ void AppendMaterial(const T_MATL_D& m, std::vector<double>& to)
     Append(to, {m.E, m.fck, m.fyk, m.Es, mean.fc, mean.fy, mean.fyw});
     Append(to,
            {m.confidence.value_or(0.0), m.knowledge ? 1.0 + static_cast<int>(*m.knowledge) : 0.0});
+    if (m.type == MATL_CLASS::Steel) Append(to, {m.Fy});
 }
 
 void AppendSection(const T_SECT_D& s, std::vector<double>& to)
@@ -84,19 +129,22 @@ void AppendSection(const T_SECT_D& s, std::vector<double>& to)
     Append(to, {s.size[0], s.size[1], d.cover, d.stirrupDiameter, d.stirrupSpacing, d.lapLength});
     Append(to, {1.0 * d.legsY, 1.0 * d.legsZ, 1.0 * static_cast<int>(d.hooks),
                 d.tiesInCore ? 1.0 : 0.0, d.poorSplice ? 1.0 : 0.0});
+    if (s.shape != SECT_SHAPE::Rectangle)
+        Append(to, {1.0 * static_cast<int>(s.shape), s.size[2], s.size[3]});
     for (const T_REBAR& bar : s.bars)
         Append(to, {bar.y, bar.z, bar.area});
 }
 
 } // namespace
 
-int ReadMember(const T_MODEL& model, int element, const CInitialAxial& axial, T_RC_MEMBER& out,
+int ReadMember(const T_MODEL& model, int element, const CInitialAxial& axial, T_HINGE_MEMBER& out,
                std::string& reason)
 {
     const auto found = model.elements.find(element);
     if (found == model.elements.end()) return Refuse(reason, Say("IDS_CMD_IEHP_NO_ELEM"));
     const T_ELEM_D& e = found->second;
-    if (e.kind != ELEM_KIND::Beam) return Refuse(reason, Say("IDS_QM_GEN_NO_BEAM"));
+    if (e.kind != ELEM_KIND::Beam && e.kind != ELEM_KIND::Truss)
+        return Refuse(reason, Say("IDS_QM_GEN_NO_BEAM"));
     if (!model.sections.contains(e.section)) return Refuse(reason, Say("IDS_CMD_IEHP_NO_SECT"));
     if (!model.materials.contains(e.material)) return Refuse(reason, Say("IDS_CMD_IEHP_NO_MATL"));
     if (e.member != 0)
@@ -111,7 +159,7 @@ int ReadMember(const T_MODEL& model, int element, const CInitialAxial& axial, T_
         x[i] -= start[i];
         whole[i] -= nodeI[i];
     }
-    T_RC_MEMBER m;
+    T_HINGE_MEMBER m;
     m.clear = std::sqrt(Dot(x, x));
     m.length = std::sqrt(Dot(whole, whole));
     if (!(m.clear > 0.0) || !(Dot(x, whole) > 0.0)) return Refuse(reason, Say("IDS_QM_GEN_CLEAR"));
@@ -120,8 +168,7 @@ int ReadMember(const T_MODEL& model, int element, const CInitialAxial& axial, T_
     m.element = element;
     m.section = e.section;
     m.material = e.material;
-    m.column = std::fabs(x[VerticalAxis(model)]) > std::sqrt(0.5);
-    m.bending = BendingOf(model, e, x, m.column);
+    SetKind(model, e, x, m);
     m.axial = axial.Of(element);
     const double squash = SquashLoad(model.sections.at(e.section), model.materials.at(e.material));
     if (std::fabs(m.axial.I - m.axial.J) <= kSameAxial * squash) m.axial.J = m.axial.I;
@@ -130,13 +177,13 @@ int ReadMember(const T_MODEL& model, int element, const CInitialAxial& axial, T_
     return 1;
 }
 
-T_RC_END EndOf(const T_MODEL& model, const T_RC_MEMBER& member, HINGE_CODE code, bool secondary,
-               HINGE_COMPONENT component, double axial)
+T_MEMBER_END EndOf(const T_MODEL& model, const T_HINGE_MEMBER& member, HINGE_CODE code,
+                   bool secondary, HINGE_COMPONENT component, double axial)
 {
-    T_RC_END end;
+    T_MEMBER_END end;
     end.code = code;
     end.secondary = secondary;
-    end.column = member.column;
+    end.kind = member.kind;
     end.aboutY = component == kMy;
     end.section = model.sections.at(member.section);
     end.material = model.materials.at(member.material);
@@ -144,12 +191,16 @@ T_RC_END EndOf(const T_MODEL& model, const T_RC_MEMBER& member, HINGE_CODE code,
     (void)CSectionProperties::Calc(end.section, end.section, fault); // judged with the strengths
     end.clear = member.clear;
     end.axial = axial;
-    end.EI = end.material.E * (end.aboutY ? end.section.Iyy : end.section.Izz);
+    const T_MATL_D& m = end.material;
+    end.EI = m.E * (end.aboutY ? end.section.Iyy : end.section.Izz);
+    end.EA = m.E * end.section.area;
+    end.GA =
+        m.G.value_or(m.E / (2.0 * (1.0 + m.nu))) * (end.aboutY ? end.section.Asz : end.section.Asy);
     end.length = member.length;
     return end;
 }
 
-std::vector<double> InputsOf(const T_MODEL& model, const T_RC_MEMBER& member)
+std::vector<double> InputsOf(const T_MODEL& model, const T_HINGE_MEMBER& member)
 {
     const T_SECT_D& section = model.sections.at(member.section);
     const T_MATL_D& material = model.materials.at(member.material);
@@ -157,8 +208,8 @@ std::vector<double> InputsOf(const T_MODEL& model, const T_RC_MEMBER& member)
     // Axial forces first, over the squash load, so that their tolerance is that of all.
     std::vector<double> inputs;
     for (const double force : {member.axial.I, member.axial.J})
-        inputs.push_back(member.column && squash > 0.0 ? force / squash : 0.0);
-    Append(inputs, {member.column ? 1.0 : 0.0, member.clear, member.length});
+        inputs.push_back(member.HasAxial() && squash > 0.0 ? force / squash : 0.0);
+    Append(inputs, {static_cast<double>(member.kind), member.clear, member.length});
     for (const HINGE_COMPONENT c : {kMy, kMz}) {
         const auto at = static_cast<std::size_t>(c);
         Append(inputs, {member.release.I[at] ? 1.0 : 0.0, member.release.J[at] ? 1.0 : 0.0});

@@ -3,30 +3,36 @@
 #pragma once
 
 #include "qm_db/dbdoc.h"
-#include "qm_rps/generate/rchinge.h"
+#include "qm_rps/generate/codeside.h"
 #include "qm_rps/hinge/axial/initialaxial.h"
 
-/// One element. Steeper than 45 degrees it is a column, else a beam.
-struct T_RC_MEMBER {
+/// One element.
+struct T_HINGE_MEMBER {
     int element = 0, section = 0, material = 0;
-    bool column = false;
+    MEMBER_KIND kind = MEMBER_KIND::Beam;
     double clear = 0.0, length = 0.0;
     T_ENDS<double> axial{};               // compression positive
     std::vector<HINGE_COMPONENT> bending; // about which axes
     T_ENDS<T_DIRS6> release{};
+
+    bool HasAxial() const { return IsUpright(kind); }
 };
 
-/// Columns bend about y and z, beams about y; in a plane model each about the axis that is normal
-/// to the plane. 1 done; 0 with the reason: no beam element, section or material missing, one of
-/// several elements of a member, nothing left between the offsets.
+/// A truss, and a beam element of steel whose both ends turn freely, is a brace. Steeper than 45
+/// degrees a member is a column (masonry: pier), else a beam (spandrel); a column whose section is
+/// that of a wall and bends about its strong axis is a wall.
+/// Columns bend about y and z, beams about y, walls and piers about their strong axis; in a plane
+/// model each about the axis that is normal to the plane. 1 done; 0 with the reason: no such
+/// element, section or material missing, one of several elements of a member, nothing left between
+/// the offsets.
 [[nodiscard]] int ReadMember(const T_MODEL& model, int element, const CInitialAxial& axial,
-                             T_RC_MEMBER& out, std::string& reason);
+                             T_HINGE_MEMBER& out, std::string& reason);
 
 /// The end of a member about an axis as the codes' formulas take it.
-T_RC_END EndOf(const T_MODEL& model, const T_RC_MEMBER& member, HINGE_CODE code, bool secondary,
-               HINGE_COMPONENT component, double axial);
+T_MEMBER_END EndOf(const T_MODEL& model, const T_HINGE_MEMBER& member, HINGE_CODE code,
+                   bool secondary, HINGE_COMPONENT component, double axial);
 
 /// All that a hinge type hangs on, in a fixed order.
-std::vector<double> InputsOf(const T_MODEL& model, const T_RC_MEMBER& member);
-/// Equal but for rounding; axial forces to 1e-6 of Ag fc.
+std::vector<double> InputsOf(const T_MODEL& model, const T_HINGE_MEMBER& member);
+/// Equal but for rounding; axial forces to 1e-6 of the squash load.
 bool SameInputs(const std::vector<double>& a, const std::vector<double>& b);

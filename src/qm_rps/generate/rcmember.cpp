@@ -37,14 +37,6 @@ double Expected(double mean, double characteristic, ASCE_MATERIAL kind, const ch
                      std::string(member) + " x " + CodeNumber(factor), CODE_MARK::Recalled);
 }
 
-std::optional<double> Confidence(const T_MATL_D& m, CCodeSheet& sheet)
-{
-    if (m.confidence) return sheet.Put("CF", *m.confidence, "", "confidence_factor", K);
-    if (m.knowledge) return ConfidenceFactor(static_cast<int>(*m.knowledge) + 1, sheet);
-    sheet.Refuse(CODE_REASON::Missing, "knowledge", "KL1, KL2, KL3, confidence_factor");
-    return {};
-}
-
 T_RC_MATERIAL Divided(const T_MATL_MEAN& mean, double factor, CCodeSheet& sheet)
 {
     const auto put = [&](const char* symbol, double value, const char* text) {
@@ -61,52 +53,82 @@ T_RC_MATERIAL Divided(const T_MATL_MEAN& mean, double factor, CCodeSheet& sheet)
     return r;
 }
 
+/// Tension and compression steel and their depths. Of a circle the bars of either half count.
+bool PutBars(const T_SECT_D& s, bool aboutY, bool positive, T_RC_BENDING& r, CCodeSheet& sheet)
+{
+    std::vector<double> depths; // from the compressed edge
+    for (const T_REBAR& bar : s.bars)
+        depths.push_back(0.5 * r.h - (positive ? 1.0 : -1.0) * (aboutY ? bar.z : bar.y));
+    const auto [first, last] = std::ranges::minmax(depths);
+    const double least = r.round ? 0.5 * r.h : last - kSameRow * r.h;
+    const double most = r.round ? 0.5 * r.h : first + kSameRow * r.h;
+    T_ROW_SUM tension, compression;
+    for (std::size_t i = 0; i < depths.size(); ++i)
+        if (depths[i] >= least)
+            tension.Add(s.bars[i].area, depths[i]);
+        else if (depths[i] <= most)
+            compression.Add(s.bars[i].area, depths[i]);
+        else
+            r.AsWeb += s.bars[i].area;
+    if (!sheet.Positive({{"As", tension.area}, {"AsPrime", compression.area}})) return false;
+    r.As = sheet.Put("As", tension.area, T_DIM{0, 2}, "", r.round ? "half of the bars" : "", K);
+    r.AsPrime = sheet.Put("As'", compression.area, T_DIM{0, 2}, "", "", K);
+    r.d = r.round ? sheet.Put("d", 0.8 * r.h, kDimLength, "ACI 318 22.5.2.2", "0.8 D",
+                              CODE_MARK::Recalled)
+                  : sheet.Put("d", tension.moment / tension.area, kDimLength, "", "", K);
+    r.dPrime = sheet.Put("d'", compression.moment / compression.area, kDimLength, "", "", K);
+    r.barDiameter = 2.0 * std::sqrt(tension.largest / std::numbers::pi);
+    return true;
+}
+
 } // namespace
+
+bool IsWallSection(const T_SECT_D& section)
+{
+    constexpr double kWall = 4.0;
+    const auto [thin, wide] = std::minmax(section.size[0], section.size[1]);
+    return section.shape == SECT_SHAPE::Rectangle && wide > kWall * thin;
+}
 
 std::optional<T_RC_BENDING> RcBending(const T_SECT_D& s, bool aboutY, bool positive,
                                       CCodeSheet& sheet)
 {
-    if (s.shape != SECT_SHAPE::Rectangle || !s.detailing || s.bars.empty()) {
+    const bool round = s.shape == SECT_SHAPE::Circle;
+    if ((!round && s.shape != SECT_SHAPE::Rectangle) || !s.detailing || s.bars.empty()) {
         sheet.Refuse(CODE_REASON::Missing,
-                     s.shape != SECT_SHAPE::Rectangle ? "shape: rectangle"
-                     : s.bars.empty()                 ? "bars"
-                                                      : "detailing",
+                     s.bars.empty() ? "bars"
+                     : s.detailing  ? "shape: rectangle, circle"
+                                    : "detailing",
                      s.name);
         return {};
     }
     const T_SECT_DETAIL& detail = *s.detailing;
     T_RC_BENDING r;
-    r.h = s.size[aboutY ? 0 : 1];
-    r.b = s.size[aboutY ? 1 : 0];
-    std::vector<double> depths; // from the compressed edge
-    for (const T_REBAR& bar : s.bars)
-        depths.push_back(0.5 * r.h - (positive ? 1.0 : -1.0) * (aboutY ? bar.z : bar.y));
-    const auto [first, last] = std::ranges::minmax(depths);
-    T_ROW_SUM tension, compression;
-    for (std::size_t i = 0; i < depths.size(); ++i)
-        if (depths[i] >= last - kSameRow * r.h)
-            tension.Add(s.bars[i].area, depths[i]);
-        else if (depths[i] <= first + kSameRow * r.h)
-            compression.Add(s.bars[i].area, depths[i]);
-        else
-            r.AsWeb += s.bars[i].area;
-    sheet.Positive({{"As", tension.area}, {"AsPrime", compression.area}});
+    r.round = round;
+    r.h = s.size[aboutY || round ? 0 : 1];
+    r.b = round ? r.h : s.size[aboutY ? 1 : 0];
+    r.area = round ? std::numbers::pi / 4.0 * r.h * r.h : r.b * r.h;
     sheet.Positive({{"stirrup_spacing", detail.stirrupSpacing}});
     if (!sheet.Positive({{"stirrup_diameter", detail.stirrupDiameter}})) return {};
-    r.As = sheet.Put("As", tension.area, T_DIM{0, 2}, "", "", K);
-    r.AsPrime = sheet.Put("As'", compression.area, T_DIM{0, 2}, "", "", K);
-    r.d = sheet.Put("d", tension.moment / tension.area, kDimLength, "", "", K);
-    r.dPrime = sheet.Put("d'", compression.moment / compression.area, kDimLength, "", "", K);
-    r.barDiameter = 2.0 * std::sqrt(tension.largest / std::numbers::pi);
+    if (!PutBars(s, aboutY, positive, r, sheet)) return {};
     const double edge = 2.0 * detail.cover + detail.stirrupDiameter;
     r.coreB = r.b - edge;
     r.coreH = r.h - edge;
-    r.legs = aboutY ? detail.legsZ : detail.legsY;
-    r.across = aboutY ? detail.legsY : detail.legsZ;
+    if (!sheet.Positive({{"cover", r.coreB}, {"cover", r.coreH}})) return {};
+    r.legs = round ? 2 : aboutY ? detail.legsZ : detail.legsY;
+    r.across = round ? 2 : aboutY ? detail.legsY : detail.legsZ;
     r.legArea = std::numbers::pi / 4.0 * detail.stirrupDiameter * detail.stirrupDiameter;
     r.shear = sheet.Put("Av", r.legs * r.legArea, T_DIM{0, 2}, "", "", K);
     r.spacing = detail.stirrupSpacing;
     return r;
+}
+
+std::optional<double> ConfidenceOf(const T_MATL_D& m, CCodeSheet& sheet)
+{
+    if (m.confidence) return sheet.Put("CF", *m.confidence, "", "confidence_factor", K);
+    if (m.knowledge) return ConfidenceFactor(static_cast<int>(*m.knowledge) + 1, sheet);
+    sheet.Refuse(CODE_REASON::Missing, "knowledge", "KL1, KL2, KL3, confidence_factor");
+    return {};
 }
 
 std::optional<T_RC_MATERIAL> RcMaterial(const T_MATL_D& m, HINGE_CODE code, CCodeSheet& sheet)
@@ -120,7 +142,7 @@ std::optional<T_RC_MATERIAL> RcMaterial(const T_MATL_D& m, HINGE_CODE code, CCod
     if (IsChordCode(code)) {
         if (!(mean.fc > 0.0)) sheet.Refuse(CODE_REASON::Missing, "mean.fc", m.name);
         if (!(mean.fy > 0.0)) sheet.Refuse(CODE_REASON::Missing, "mean.fy", m.name);
-        const std::optional<double> factor = sheet.Sound() ? Confidence(m, sheet) : std::nullopt;
+        const std::optional<double> factor = sheet.Sound() ? ConfidenceOf(m, sheet) : std::nullopt;
         if (!factor || !sheet.Positive({{"confidence_factor", *factor}})) return {};
         r = Divided(mean, *factor, sheet);
     } else {

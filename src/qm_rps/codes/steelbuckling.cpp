@@ -1,0 +1,92 @@
+#include "qm_rps/codes/steelbuckling.h"
+
+#include <algorithm>
+#include <array>
+#include <cmath>
+#include <numbers>
+
+namespace {
+
+constexpr auto R = CODE_MARK::Recalled;
+constexpr auto K = CODE_MARK::Computed;
+constexpr const char* kCurves = "EN 1993-1-1 Table 6.2";
+constexpr const char* kEn = "EN 1993-1-1 6.3.1.2";
+constexpr const char* kAisc = "AISC 360 E3";
+constexpr double kPi = std::numbers::pi;
+
+enum CURVE { CurveA0, CurveA, CurveB, CurveC, CurveD };
+// EN 1993-1-1 Table 6.1.
+constexpr std::array<double, 5> kImperfections{0.13, 0.21, 0.34, 0.49, 0.76};
+constexpr std::array<const char*, 5> kNames{"a0", "a", "b", "c", "d"};
+
+struct T_ROW {
+    STEEL_SHAPE shape;
+    double deep;     // h / b above which the row holds
+    double thickest; // tf, m
+    CURVE major, minor;
+};
+constexpr double kAny = 1e9;
+// clang-format off
+// EN 1993-1-1 Table 6.2, S235 to S420; the first row that holds.
+constexpr std::array<T_ROW, 8> kRows{{
+    // shape                        h/b   tf     y       z
+    {STEEL_SHAPE::RolledI,          1.2,  0.040, CurveA, CurveB},
+    {STEEL_SHAPE::RolledI,          1.2,  0.100, CurveB, CurveC},
+    {STEEL_SHAPE::RolledI,          0.0,  0.100, CurveB, CurveC},
+    {STEEL_SHAPE::RolledI,          0.0,  kAny,  CurveD, CurveD},
+    {STEEL_SHAPE::WeldedI,          0.0,  0.040, CurveB, CurveC},
+    {STEEL_SHAPE::WeldedI,          0.0,  kAny,  CurveC, CurveD},
+    {STEEL_SHAPE::RectangularTube,  0.0,  kAny,  CurveC, CurveC},
+    {STEEL_SHAPE::CircularTube,     0.0,  kAny,  CurveC, CurveC},
+}};
+// clang-format on
+
+bool Sound(const T_BUCKLING& b, CCodeSheet& sheet)
+{
+    sheet.Positive({{"area", b.area}, {"length", b.length}, {"radius", b.radius}});
+    return sheet.Positive({{"fy", b.fy}, {"E", b.E}});
+}
+
+} // namespace
+
+double EnImperfection(const T_STEEL_SHAPE& s, bool minor, CCodeSheet& sheet)
+{
+    const double deep = s.b > 0.0 ? s.h / s.b : 1.0;
+    const auto row = std::ranges::find_if(kRows, [&](const T_ROW& r) {
+        return r.shape == s.shape && deep > r.deep && s.tf <= r.thickest;
+    });
+    const CURVE curve = row == kRows.end() ? CurveD : minor ? row->minor : row->major;
+    return sheet.Put(
+        "alpha", kImperfections[curve], kCurves,
+        std::string("curve ") + kNames[curve] +
+            (s.shape == STEEL_SHAPE::RectangularTube || s.shape == STEEL_SHAPE::CircularTube
+                 ? "; hot finished: a"
+                 : ""),
+        R);
+}
+
+std::optional<double> EnBuckling(const T_BUCKLING& b, double imperfection, CCodeSheet& sheet)
+{
+    if (!Sound(b, sheet) || !sheet.NotNegative({{"imperfection", imperfection}})) return {};
+    const double slender = sheet.Put("lambda", b.length / b.radius / (kPi * std::sqrt(b.E / b.fy)),
+                                     kEn, "(K L/i)/(pi sqrt(E/fy))", R);
+    const double phi = 0.5 * (1.0 + imperfection * (slender - 0.2) + slender * slender);
+    const double chi =
+        slender <= 0.2 ? 1.0 : 1.0 / (phi + std::sqrt(phi * phi - slender * slender));
+    sheet.Put("chi", std::min(1.0, chi), kEn,
+              "1/(Phi + sqrt(Phi^2 - l^2)) <= 1, Phi = 0.5 (1 + alpha (l - 0.2) + l^2)", R);
+    return sheet.Put("Nb", std::min(1.0, chi) * b.area * b.fy, kDimForce, kEn, "chi A fy", R);
+}
+
+std::optional<double> AiscBuckling(const T_BUCKLING& b, CCodeSheet& sheet)
+{
+    if (!Sound(b, sheet)) return {};
+    const double slender = sheet.Put("K L/r", b.length / b.radius, kAisc, "", K);
+    const double euler = sheet.Put("Fe", kPi * kPi * b.E / (slender * slender), kDimStress, kAisc,
+                                   "pi^2 E/(K L/r)^2", R);
+    const double ratio = b.fy / euler;
+    const double stress =
+        sheet.Put("Fcr", ratio <= 2.25 ? std::pow(0.658, ratio) * b.fy : 0.877 * euler, kDimStress,
+                  kAisc, "0.658^(Fy/Fe) Fy, Fy/Fe <= 2.25; 0.877 Fe", R);
+    return sheet.Put("Pn", stress * b.area, kDimForce, kAisc, "Fcr A", R);
+}

@@ -1,0 +1,78 @@
+// What a code gives for one side of a component of a member end, and what it is made of. SI.
+#pragma once
+
+#include "qm_rps/codes/codebackbone.h"
+
+#include <array>
+
+enum class HINGE_CODE { Asce17, Asce13, Fema356, En1998, Circolare2019 };
+inline constexpr std::array<const char*, 5> kHingeCodeNames{"ASCE41-17", "ASCE41-13", "FEMA356",
+                                                            "EN1998-3", "Circolare2019"};
+/// Chord rotations with DL, SD, NC; else plastic rotations with IO, LS, CP.
+inline bool IsChordCode(HINGE_CODE code)
+{
+    return code >= HINGE_CODE::En1998;
+}
+
+/// What a member is to the codes. Steep (above 45 degrees): column, wall, pier; else beam,
+/// spandrel.
+enum class MEMBER_KIND { Beam, Column, Wall, Brace, Pier, Spandrel };
+inline constexpr std::array<const char*, 6> kMemberKindNames{"beam",  "column", "wall",
+                                                             "brace", "pier",   "spandrel"};
+
+/// Their hinges hang on the axial force; the others are taken without one.
+inline bool IsUpright(MEMBER_KIND kind)
+{
+    return kind == MEMBER_KIND::Column || kind == MEMBER_KIND::Wall || kind == MEMBER_KIND::Pier;
+}
+
+/// Of a stored push, at the step at which the hinge yields.
+struct T_PUSHED_SHEAR {
+    double shear = 0.0, shearSpan = 0.0; // V; M / V
+};
+
+/// What a hinge stands on.
+struct T_MEMBER_END {
+    HINGE_CODE code = HINGE_CODE::Asce17;
+    bool secondary = false; // member
+    MEMBER_KIND kind = MEMBER_KIND::Beam;
+    bool aboutY = true;
+    T_SECT_D section; // with its properties
+    T_MATL_D material;
+    double clear = 0.0;  // length between the offsets
+    double axial = 0.0;  // compression positive
+    double EI = 0.0;     // of the model: up to yield it bends with 6 EI / length
+    double EA = 0.0;     // of the model
+    double GA = 0.0;     // of the model, across the axis of bending; 0: no shear deformation
+    double length = 0.0; // of the member in the model
+    double tie = 0.0;    // of spandrels: strength of what ties the wall there; 0: nothing
+    std::optional<T_PUSHED_SHEAR> pushed{}; // else V of both ends' strengths, shear span clear / 2
+
+    double ShearSpan() const { return pushed ? pushed->shearSpan : clear / 2.0; }
+    bool HasAxial() const { return IsUpright(kind); }
+};
+
+struct T_CODE_SIDE {
+    double strength = 0.0;       // moment or force, at the axial force
+    double strengthAtZero = 0.0; // without one
+    double shear = 0.0;          // at the strengths of both ends, no load along the member
+    double shearStrength = 0.0;  // 0: not told
+    double hingeLength = 0.0;    // chord codes: Lpl
+    T_CODE_BACKBONE bone;
+    /// Of a hinge of shear in the middle of the member, where shear may fail first; in the
+    /// displacement of one end across the other.
+    std::optional<T_CODE_BACKBONE> shearBone{};
+    std::vector<T_CODE_TRACE> trace;
+    std::vector<T_CODE_WARNING> warnings;
+};
+
+/// V of an end on its sheet: of the push, or of the strengths at both ends.
+inline double ShearOf(const T_MEMBER_END& end, double capacity, CCodeSheet& sheet)
+{
+    constexpr auto K = CODE_MARK::Computed;
+    sheet.Put("LV", end.ShearSpan(), kDimLength, "",
+              end.pushed ? "M/V of the push" : "clear length/2", K);
+    return sheet.Put(
+        "V", end.pushed ? end.pushed->shear : capacity, kDimForce, "",
+        end.pushed ? "of the push, where the hinge yields" : "(My(+) + My(-))/clear length", K);
+}

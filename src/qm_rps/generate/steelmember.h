@@ -1,0 +1,30 @@
+// A member of steel as the codes' formulas take it: I, box and pipe with their strengths. SI.
+#pragma once
+
+#include "qm_rps/codes/asce41steel.h"
+#include "qm_rps/codes/steelinteraction.h"
+#include "qm_rps/generate/codeside.h"
+
+struct T_STEEL_BASIS {
+    const T_MEMBER_END& end;
+    T_STEEL_SHAPE shape;
+    T_STEEL_PLASTIC_STRENGTH strength; // with fy
+    double fy = 0.0;    // ASCE 41: expected; else the mean over the confidence factor
+    double lower = 0.0; // ASCE 41: lower bound
+    double E = 0.0;
+    double Z = 0.0, I = 0.0;   // about the axis of bending
+    double iy = 0.0, iz = 0.0; // radii of gyration
+    double axial = 0.0;        // that counts
+
+    double Least() const { return iy < iz ? iy : iz; }
+    /// I, Z and plates as ASCE 41 takes them.
+    T_STEEL_MEMBER Member() const;
+};
+
+/// Plates are taken as welded, without fillets. ASCE 41: the material's mean, else Fy times the
+/// factor of Table 9-3. EN 1998-3, Circolare: the mean, else Fy with a warning, over the confidence
+/// factor. Refuses other shapes and materials.
+std::optional<T_STEEL_BASIS> SteelBasis(const T_MEMBER_END& end, CCodeSheet& sheet);
+
+/// Plastic moment with an axial force of either sign: ASCE 41, or EN 1993-1-1 6.2.9.
+std::optional<double> SteelMoment(const T_STEEL_BASIS& in, double axial, CCodeSheet& sheet);
