@@ -47,7 +47,8 @@ double At(const T_LINE& line, double axial)
 {
     const auto above = std::ranges::lower_bound(line, axial, {}, &T_LINE_POINT::axial);
     if (above == line.end()) return line.back().moment;
-    if (above == line.begin()) return above->moment;
+    // A point itself: the formula below may round a 0 to less.
+    if (above == line.begin() || above->axial == axial) return above->moment;
     const T_LINE_POINT& below = *(above - 1);
     return below.moment +
            (above->moment - below.moment) * (axial - below.axial) / (above->axial - below.axial);
