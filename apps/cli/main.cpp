@@ -52,6 +52,7 @@ int RunCommand(int argc, char** argv)
     AddModel(app, code);
     AddEvaluations(app, code);
     AddHingeCommands(app, code);
+    AddSection(app, code);
     AddCase(app, code);
     AddAnalyse(app, code);
     AddPush(app, code);

@@ -1,5 +1,6 @@
 #include "hinge/generatehinges.h"
 
+#include "console/tabletext.h"
 #include "inputfile.h"
 #include "output.h"
 #include "qm_base/say.h"
@@ -14,23 +15,6 @@
 namespace {
 
 constexpr HINGE_DEFINITION kMeasure = HINGE_DEFINITION::MomentRotation;
-using T_TABLE_ROWS = std::vector<std::vector<std::string>>;
-
-/// Columns under their heads, numbers to the right, the last one to the left.
-std::string TableText(const T_TABLE_ROWS& rows)
-{
-    std::vector<std::size_t> width(rows.front().size());
-    for (const auto& row : rows)
-        for (std::size_t c = 0; c < row.size(); ++c)
-            width[c] = std::max(width[c], row[c].size());
-    std::string text;
-    for (const auto& row : rows) {
-        for (std::size_t c = 0; c + 1 < row.size(); ++c)
-            text += std::string(width[c] - row[c].size(), ' ') + row[c] + "  ";
-        text += row.back() + '\n';
-    }
-    return text;
-}
 
 std::string Number(double value)
 {

@@ -1,5 +1,7 @@
 #include "qm_rps/hinge/sectionbending.h"
 
+#include "qm_rps/outline/sectionoutline.h"
+
 #include <algorithm>
 #include <cmath>
 #include <numbers>
@@ -7,55 +9,6 @@
 namespace {
 
 using namespace solver;
-
-T_RING Rectangle(double width, double depth)
-{
-    const double y = width / 2.0, z = depth / 2.0;
-    return {{-y, -z}, {y, -z}, {y, z}, {-y, z}};
-}
-
-T_RING Circle(double diameter)
-{
-    return {{diameter / 2.0, 0.0, 1.0}, {-diameter / 2.0, 0.0, 1.0}};
-}
-
-/// Height a, width b, web c, flanges d.
-T_RING IShape(double a, double b, double c, double d)
-{
-    const double y = b / 2.0, w = c / 2.0, z = a / 2.0, f = z - d;
-    return {{-y, -z}, {y, -z}, {y, -f}, {w, -f}, {w, f},   {y, f},
-            {y, z},   {-y, z}, {-y, f}, {-w, f}, {-w, -f}, {-y, -f}};
-}
-
-/// Outline and hollow; none of a section given by values.
-std::vector<T_RING> Rings(const T_SECT_D& section)
-{
-    const auto& [a, b, c, d] = section.size;
-    switch (section.shape) {
-    case SECT_SHAPE::Rectangle:
-        return {Rectangle(b, a)};
-    case SECT_SHAPE::Circle:
-        return {Circle(a)};
-    case SECT_SHAPE::Pipe:
-        return {Circle(a), Circle(a - 2.0 * b)};
-    case SECT_SHAPE::Box:
-        return {Rectangle(b, a), Rectangle(b - 2.0 * c, a - 2.0 * d)};
-    case SECT_SHAPE::IShape:
-        return {IShape(a, b, c, d)};
-    case SECT_SHAPE::Value:
-        break;
-    }
-    return {};
-}
-
-T_STRESS_LAW SteelLaw(double strength, double modulus)
-{
-    T_STRESS_LAW law;
-    law.kind = STRESS_LAW::Steel;
-    law.strength = strength;
-    law.modulus = modulus;
-    return law;
-}
 
 T_SECTION_MODEL ConcreteModel(const T_SECT_D& section, const T_MATL_D& material,
                               const T_CONCRETE_LAW& law)
@@ -67,7 +20,7 @@ T_SECTION_MODEL ConcreteModel(const T_SECT_D& section, const T_MATL_D& material,
     concrete.exponent = law.n;
     T_SECTION_MODEL model;
     model.laws = {concrete, SteelLaw(material.fyk, material.Es)};
-    model.regions = {{Rings(section), 0}};
+    model.regions = {{SectionRings(section), 0}};
     model.lumped = true;
     for (const T_REBAR& bar : section.bars)
         model.bars.push_back({bar.y, bar.z, bar.area, 1});
@@ -78,7 +31,7 @@ T_SECTION_MODEL SteelModel(const T_SECT_D& section, double fy)
 {
     T_SECTION_MODEL model;
     model.laws = {SteelLaw(fy, 0.0)};
-    model.regions = {{Rings(section), 0}};
+    model.regions = {{SectionRings(section), 0}};
     model.plastic = true;
     return model;
 }
