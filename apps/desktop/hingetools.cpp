@@ -1,10 +1,13 @@
 #include "hingetools.h"
 
+#include "qm_base/say.h"
 #include "qm_rps/hingeoptionsdlg.h"
 #include "qm_rps/po_hingetypelistdlg.h"
 #include "qm_rps/pushoverhingedatatype.h"
 #include "qm_rps/pushoverhingelistdlg.h"
+#include "qm_rps/sectioncurvesdlg.h"
 #include "qm_ui/hinge/hingeviews.h"
+#include "qm_ui/section/sectionviews.h"
 
 namespace {
 
@@ -43,6 +46,21 @@ void RunOptions(T_DESKTOP& desktop)
     if (options.DoModal()) desktop.changed();
 }
 
+/// section: key of the one to begin with; 0: the first.
+void RunSectionCurves(T_DESKTOP& desktop, int section)
+{
+    CSectionCurvesDlg curves(desktop.doc);
+    curves.SetView(&desktop.view);
+    curves.m_askFile = [&desktop] {
+        const auto text = [](const char* key) { return QString::fromStdString(Say(key)); };
+        return AskFileName(desktop.window, true, text("IDS_QM_UI_SECC_TITLE"),
+                           text("IDS_QM_UI_SECC_FILES"))
+            .toStdString();
+    };
+    curves.OnOpenSection(section);
+    (void)curves.DoModal();
+}
+
 void RunTypeEditor(T_DESKTOP& desktop, int key)
 {
     CPO_HingeTypeListDlg list(desktop.doc);
@@ -59,7 +77,8 @@ void RegisterHingeViews(CViewFactory& factory)
     for (const auto add :
          {RegisterHingeListViews, RegisterHingeTypeView, RegisterHingeFemaViews,
           RegisterHingeMultiView, RegisterHingeEuroView, RegisterHingeInteractionViews,
-          RegisterHingeLengthViews, RegisterHingeStrengthViews, RegisterHingeOptionsView})
+          RegisterHingeLengthViews, RegisterHingeStrengthViews, RegisterHingeOptionsView,
+          RegisterSectionViews})
         add(factory);
 }
 
@@ -69,6 +88,7 @@ T_COMMANDS HingeCommands(T_DESKTOP& desktop)
             {kMenu, "IDS_QM_UI_HINGES_GENERATED", "Ctrl+Shift+G",
              [&desktop] { RunHingeList(desktop, 0); }},
             {kMenu, "IDS_QM_UI_HINGE_TABLE", "", [&desktop] { RunTable(desktop); }},
+            {kMenu, "IDS_QM_UI_SECC_CMD", "", [&desktop] { RunSectionCurves(desktop, 0); }},
             {kMenu, "IDS_QM_UI_HINGE_OPTIONS_CMD", "", [&desktop] { RunOptions(desktop); }}};
 }
 
@@ -78,6 +98,8 @@ bool OpenHingeRecord(T_DESKTOP& desktop, EXPLORER_TABLE table, int key)
         RunTypeEditor(desktop, key);
     else if (table == EXPLORER_TABLE::Hinges)
         RunHingeList(desktop, key);
+    else if (table == EXPLORER_TABLE::Sections)
+        RunSectionCurves(desktop, key);
     else
         return false;
     return true;

@@ -40,7 +40,8 @@ void AddPlaces(CLI::App* sub, T_SECTION_COMMAND& o)
         sub->add_option("--max-curvature", o.maxCurvature, Say("IDS_QM_HELP_SECC_MAX"));
     if (o.task == SECTION_TASK::Capacity) return;
     sub->add_option("--points", o.points,
-                    Say(surface ? "IDS_QM_HELP_SECC_DIRECTIONS" : "IDS_QM_HELP_SECC_POINTS"));
+                    surface ? Say("IDS_QM_HELP_SECC_DIRECTIONS")
+                            : Say("IDS_QM_HELP_SECC_POINTS", std::to_string(o.points)));
     if (o.task == SECTION_TASK::Curvature)
         sub->add_flag("--table", o.table, Say("IDS_QM_HELP_SECC_TABLE"));
 }
@@ -49,6 +50,7 @@ void AddTask(const T_GROUP& group, SECTION_TASK task, const char* help, const ch
 {
     const auto o = std::make_shared<T_SECTION_COMMAND>();
     o->task = task;
+    if (task == SECTION_TASK::Curvature) o->points = static_cast<int>(kCurvaturePoints);
     auto* sub = AddOne(group, kSectionTaskNames[static_cast<std::size_t>(task)], Say(help), example,
                        o, RunSection);
     AddStrengths(sub, *o);

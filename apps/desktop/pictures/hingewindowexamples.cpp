@@ -17,6 +17,7 @@
 #include "qm_rps/pushoverhingedatatype.h"
 #include "qm_rps/pushoverhingelistdlg.h"
 #include "qm_rps/pushoverpmminteractiondlg.h"
+#include "qm_rps/sectioncurvesdlg.h"
 #include "qm_rps/yieldstrengthcalcopteffdescdlg.h"
 #include "qm_rps/yieldstrengthcalcoptmatdescdlg.h"
 #include "qm_ui/form/dialogwindow.h"
@@ -165,6 +166,16 @@ std::unique_ptr<QWidget> AxialWindow(CMainWindow& main)
     });
 }
 
+std::unique_ptr<QWidget> SectionWindow(CMainWindow& main)
+{
+    auto dlg = std::make_unique<CSectionCurvesDlg>(main.Doc());
+    dlg->m_options.values = SECTION_VALUES::Mean;
+    dlg->m_options.core = SECTION_CORE::Mander;
+    dlg->m_options.hoopStrain = 0.1;
+    dlg->m_axial = "0 400 800";
+    return WindowOf(main, std::move(dlg));
+}
+
 } // namespace
 
 std::vector<T_WINDOW_EXAMPLE> HingeWindowExamples()
@@ -214,5 +225,6 @@ std::vector<T_WINDOW_EXAMPLE> HingeWindowExamples()
         {"hinge-materials", kModel, DescriptionWindow<CYieldStrengthCalcOptMatDescDlg>},
         {"hinge-sections", kModel, DescriptionWindow<CYieldStrengthCalcOptEffDescDlg>},
         {"hinge-table", kModel, TableWindow},
+        {"section-curves", "rc-frame-code-hinges", SectionWindow},
     };
 }

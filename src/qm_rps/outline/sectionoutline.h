@@ -1,7 +1,7 @@
 // The outline of a section of records as the section calculator takes it.
 #pragma once
 
-#include "qm_db/records/structrecords.h"
+#include "qm_db/records.h"
 #include "qm_solver/sectionmodel.h"
 
 /// Outline and hollow; none of a section given by values. The dimensions must be sound.

@@ -22,6 +22,8 @@ struct T_SECTION_REQUEST {
 };
 inline constexpr std::size_t kSurfaceLevels = 9;
 inline constexpr std::size_t kMostSectionPoints = 2000;
+/// Of a moment-curvature: enough for its peak where the ultimate lies far out.
+inline constexpr std::size_t kCurvaturePoints = 120;
 
 /// Plane and forces of a state; the forces once more from the plane alone.
 struct T_SECTION_STATE {

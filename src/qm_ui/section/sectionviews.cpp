@@ -1,0 +1,109 @@
+#include "qm_ui/section/sectionviews.h"
+
+#include "qm_base/say.h"
+#include "qm_rps/sectioncurvesdlg.h"
+#include "qm_ui/push/stepfield.h"
+#include "qm_ui/section/sectionplot.h"
+
+namespace {
+
+using DLG = CSectionCurvesDlg;
+constexpr QSize kPicture{720, 440};
+
+/// A member of the options as a position in a list; a change calculates anew.
+template <class E>
+T_BINDING<int> Option(DLG& d, E T_SECTION_OPTIONS::*member)
+{
+    return {[&d, member] { return static_cast<int>(d.m_options.*member); },
+            [&d, member](const int& index) {
+                d.m_options.*member = static_cast<E>(index);
+                d.OnChanged();
+            }};
+}
+
+template <class T>
+T_BINDING<T> Member(DLG& d, T& value)
+{
+    return {[&value] { return value; },
+            [&d, &value](const T& v) {
+                value = v;
+                d.OnChanged();
+            }};
+}
+
+void AddOptions(CFormView& form, DLG& d)
+{
+    form.Choice(KeyText("IDS_QM_UI_HEAD_SECTION"),
+                {[&d] { return d.PairIndex(); }, [&d](const int& i) { d.OnSelChangePair(i); }},
+                [&d] { return d.PairTexts(); })
+        .name = "section";
+    form.Choice(KeyText("IDS_QM_UI_SECC_VALUES"), Option(d, &T_SECTION_OPTIONS::values),
+                KeyTexts({"IDS_QM_SECC_CHARACTERISTIC", "IDS_QM_SECC_MEAN", "IDS_QM_SECC_EXPECTED",
+                          "IDS_QM_SECC_LOWER", "IDS_QM_SECC_DESIGN", "IDS_QM_SECC_ASSESSED"}))
+        .name = "values";
+    form.Choice(KeyText("IDS_QM_UI_SECC_LAW"), Option(d, &T_SECTION_OPTIONS::law),
+                KeyTexts({"IDS_QM_SECC_LAW_EUROCODE", "IDS_QM_SECC_LAW_ACI"}))
+        .name = "law";
+    form.Choice(KeyText("IDS_QM_UI_SECC_CORE"), Option(d, &T_SECTION_OPTIONS::core),
+                KeyTexts({"IDS_QM_UI_SECC_CORE_PLAIN", "IDS_QM_SECC_CORE_MANDER",
+                          "IDS_QM_SECC_CORE_EUROCODE"}))
+        .name = "core";
+    form.Number(KeyText("IDS_QM_UI_SECC_DIRECTION"), Member(d, d.m_directionDeg)).name =
+        "direction";
+    form.Text([&d] { return Say("IDS_QM_UI_SECC_AXIAL", NameOf(d.Units().force)); },
+              Member(d, d.m_axial))
+        .name = "axial";
+    form.Number(KeyText("IDS_QM_UI_SECC_ALPHA"), Member(d, d.m_options.alphaCc)).name = "alphaCc";
+    form.Number(KeyText("IDS_QM_UI_SECC_STEEL_STRAIN"), Member(d, d.m_options.steelStrain)).name =
+        "steelStrain";
+    form.Number(KeyText("IDS_QM_UI_SECC_HARDENING"), Member(d, d.m_options.hardening)).name =
+        "hardening";
+    form.Number(KeyText("IDS_QM_UI_SECC_HOOP"), Member(d, d.m_options.hoopStrain)).name =
+        "hoopStrain";
+    form.Note(KeyText("IDS_QM_SECC_SIGNS"));
+    form.Space();
+}
+
+void AddPage(CFormView& form, DLG& d, SECTION_TASK task, const char* title)
+{
+    const std::string name = kSectionTaskNames[static_cast<std::size_t>(task)];
+    form.Page(KeyText(title));
+    CFormField& picture = AddPlot(
+        form,
+        [&d, task] {
+            const T_SECTION_ANSWER* const answer = d.Answer(task);
+            return answer ? SectionPlot(*answer, d.Units()) : T_PLOT();
+        },
+        kPicture);
+    picture.name = name + ".picture";
+    form.Note([&d, task] { return d.ReasonOf(task); }).name = name + ".reason";
+    CFormField& grid = form.Grid(GridOf([&d, task] { return d.Table(task); }));
+    grid.name = name + ".table";
+    grid.widget->setMinimumHeight(120);
+    grid.widget->setMaximumHeight(220);
+    form.Button(KeyText("IDS_QM_UI_SECC_EXPORT"), [&d, task] { (void)d.OnExport(task); }).name =
+        name + ".export";
+}
+
+void BuildCurves(CFormView& form, DLG& d)
+{
+    form.Columns();
+    AddOptions(form, d);
+    form.NextColumn(1);
+    AddPage(form, d, SECTION_TASK::Curvature, "IDS_QM_PLOT_SECC_CURVATURE");
+    AddPage(form, d, SECTION_TASK::Interaction, "IDS_QM_PLOT_SECC_INTERACTION");
+    AddPage(form, d, SECTION_TASK::Surface, "IDS_QM_UI_SECC_SURFACE");
+    AddPage(form, d, SECTION_TASK::Capacity, "IDS_QM_PLOT_SECC_CAPACITY");
+    form.EndPages();
+    form.EndColumns();
+}
+
+} // namespace
+
+void RegisterSectionViews(CViewFactory& factory)
+{
+    T_VIEW view;
+    view.showsOnly = true;
+    view.size = {1180, 780};
+    factory.Register<DLG>(KeyText("IDS_QM_UI_SECC_TITLE"), BuildCurves, view);
+}
