@@ -61,7 +61,6 @@ T_SECTION_STRENGTHS DesignConcrete(const T_MATL_D& m, double alphaCc, CCodeSheet
                      CodeNumber(alphaCc) + " fck/" + CodeNumber(kGammaC), R);
     s.fy = sheet.Put("fyd", s.fy / kGammaS, kDimStress, "EN 1992-1-1 3.2.7, 2.4.2.4",
                      "fyk/" + CodeNumber(kGammaS), R);
-    s.fyw = s.fy;
     return s;
 }
 
