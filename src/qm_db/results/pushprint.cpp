@@ -27,11 +27,19 @@ public:
         AddText(text.TakeText());
         if (text.Failed()) AddText(text.Error().text); // not finite, for example
     }
-    /// There may be many: without a text.
+    /// There may be many: without a text. Strengths count, not the load that they were taken at.
     void Add(const T_PHGE_D& hinge)
     {
-        static_assert(sizeof hinge == 2 * sizeof(int) + 48 * sizeof(double)); // nothing between
-        m_sum.AddBytes(std::as_bytes(std::span(&hinge, 1)));
+        using T_STRENGTHS = decltype(hinge.yield);
+        struct T_BYTES {
+            int element, hingeType;
+            T_STRENGTHS crack, yield, crackJ, yieldJ;
+        };
+        static_assert(sizeof(T_BYTES) == 2 * sizeof(int) + 48 * sizeof(double)); // nothing between
+        static_assert(sizeof hinge == sizeof(T_BYTES) + sizeof(double)); // and axialCase
+        const T_BYTES bytes{hinge.element, hinge.hingeType, hinge.crack,
+                            hinge.yield,   hinge.crackJ,    hinge.yieldJ};
+        m_sum.AddBytes(std::as_bytes(std::span(&bytes, 1)));
     }
     template <class R>
     void Add(const T_TABLE<R>& table)
