@@ -200,19 +200,6 @@ int CPushRun::PrepareCases(int key, std::vector<T_PUSH_CASE>& out, T_PREPARED*& 
 }
 
 /// P-Delta goes with the chord of a member; a kink inside it is not seen.
-std::string CPushRun::KinkWarning(const T_PREPARED& on, const T_POLC_D& record) const
-{
-    if (PushControlOf(m_model, record).pDelta == PUSH_P_DELTA::None) return {};
-    for (const solver::T_PUSH_HINGE& hinge : on.hinges.hinges) {
-        const bool bends = std::ranges::any_of(
-            hinge.laws, [](const solver::T_HINGE_LAW& law) { return law.component > 3; });
-        if (bends && hinge.at > 0.0 && hinge.at < 1.0)
-            return Say("IDS_QM_PUSH_WARN_KINK",
-                       std::to_string(m_frame.ElementIds()[hinge.element]));
-    }
-    return {};
-}
-
 int CPushRun::Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_RUN>& out,
                   std::string& error, const std::vector<double>& extra)
 {
@@ -222,7 +209,6 @@ int CPushRun::Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_
     const auto warnings = StopWarnings(m_model.pushovers.at(key).stops,
                                        !StoreysOf(m_model, m_frame, 0).empty(), on->hinges.laws);
     const std::string elastic = NoHingeText(m_model);
-    const std::string kinks = KinkWarning(*on, m_model.pushovers.at(key));
     std::vector<T_PUSH_RUN> runs;
     for (T_PUSH_CASE& c : cases) {
         std::vector<double>& steps = c.stages.back().additional;
@@ -235,7 +221,6 @@ int CPushRun::Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_
         if (!elastic.empty()) runs.back().warnings.push_back(elastic);
         for (const T_FINDING& warning : warnings)
             runs.back().warnings.push_back(warning.field + ": " + warning.text);
-        if (!kinks.empty()) runs.back().warnings.push_back(kinks);
         if (runs.back().cancelled) break;
     }
     out.insert(out.end(), std::make_move_iterator(runs.begin()),

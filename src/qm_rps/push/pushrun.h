@@ -98,7 +98,6 @@ private:
     int BuildFrame(std::string& error);
     int PrepareCases(int key, std::vector<T_PUSH_CASE>& out, T_PREPARED*& on, std::string& error);
     std::optional<std::vector<double>> FactorsBefore(int key);
-    std::string KinkWarning(const T_PREPARED& on, const T_POLC_D& record) const;
     int Prepare(const T_PUSH_BASIS& basis, T_PREPARED*& out, std::string& error);
     int PrepareNew(const T_PUSH_BASIS& basis, T_PREPARED& to, std::string& error);
     int AxialOf(const solver::T_LOAD_CASE& initial, T_PREPARED& to, std::string& error);

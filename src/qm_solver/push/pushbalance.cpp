@@ -160,7 +160,7 @@ CPushStructure::T_FAULT CPushStructure::Solve(const T_PUSH_STATE& state,
         if (count == 0) continue;
         const auto own = std::span(forces).subspan(m_firstRow[e], count);
         (void)m_elements[e].AtNodes(Gather(frame.elements[e], full), PlasticOf(e, state.plastic),
-                                    0.0, tension, own);
+                                    m_tension.empty() ? 0.0 : m_tension[e], tension, own);
         for (std::size_t l = 0; l < state.factors.size(); ++l)
             for (std::size_t c = 0; c < count; ++c)
                 own[c] += state.factors[l] * m_loads[l].element[e].force[c];
@@ -218,9 +218,9 @@ void CPushStructure::Inside(const T_PUSH_STATE& state, const T_PUSH_STEP& step, 
             }
         const T_VEC12 u = Gather(frame.elements[e], step.nodes);
         for (std::size_t p = 0; p < kBeamPositions; ++p)
-            out.force[e][p] =
-                m_elements[e].Inside(u, PlasticOf(e, state.plastic), ElementLoads(e, state.factors),
-                                     span, 0.25 * static_cast<double>(p));
+            out.force[e][p] = m_elements[e].Inside(
+                u, PlasticOf(e, state.plastic), m_tension.empty() ? 0.0 : m_tension[e],
+                ElementLoads(e, state.factors), span, 0.25 * static_cast<double>(p));
     }
 }
 

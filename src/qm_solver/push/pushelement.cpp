@@ -131,6 +131,20 @@ void CPushElement::MakeInfluence()
     }
 }
 
+/// Of fraction s, by a unit kink at component d.
+double CPushElement::OffChord(double s, std::size_t d) const
+{
+    const T_PLACED_COMPONENT& kink = m_components[d];
+    if (!m_beam || kink.component < 4) return 0.0;
+    return m_length * std::min(s, kink.at) * (1.0 - std::max(s, kink.at));
+}
+
+double CPushElement::Kink(std::size_t c, std::size_t d) const
+{
+    return m_components[c].component == m_components[d].component ? OffChord(m_components[c].at, d)
+                                                                  : 0.0;
+}
+
 void CPushElement::Stiffness(double tension, T_MATRIX12& global) const
 {
     if (!m_beam) {
@@ -304,6 +318,8 @@ T_VEC12 CPushElement::AtNodes(const T_VEC12& displacement, std::span<const doubl
         own[c] = 0.0;
         for (std::size_t i = 0; i < m_strains; ++i)
             own[c] -= m_jump[c][i] * force[i];
+        for (std::size_t d = 0; d < Size() && coupled != 0.0; ++d)
+            if (plastic[d] != 0.0) own[c] -= coupled * Kink(c, d) * plastic[d];
     }
     tension = m_beam ? force[2] : m_element.kind == ELEMENT_KIND::Truss ? force[0] : 0.0;
     if (coupled != 0.0) Add(out, Across(displacement, coupled), 1.0);
@@ -318,11 +334,18 @@ double CPushElement::Tension(const T_VEC12& loads) const
 }
 
 T_VEC6 CPushElement::Inside(const T_VEC12& displacement, std::span<const double> plastic,
-                            const T_VEC12& loads, std::span<const T_SPAN_LOAD> span, double s) const
+                            double coupled, const T_VEC12& loads, std::span<const T_SPAN_LOAD> span,
+                            double s) const
 {
     const T_VEC12 ends = Ends(displacement, plastic, loads);
-    if (m_beam) return m_beam->InternalForces(ends, span, s);
     T_VEC6 inside{};
+    if (m_beam) {
+        inside = m_beam->InternalForces(ends, span, s);
+        for (std::size_t d = 0; d < Size(); ++d)
+            inside[static_cast<std::size_t>(m_components[d].component)] -=
+                coupled * OffChord(s, d) * plastic[d];
+        return inside;
+    }
     if (m_element.kind == ELEMENT_KIND::Truss) {
         inside[0] = Dot(m_direction, Part(ends, 6));
     } else if (m_element.kind == ELEMENT_KIND::Link) {

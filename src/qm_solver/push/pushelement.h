@@ -33,8 +33,9 @@ struct T_ELEMENT_LOADS {
 /// rotation across the hinge, the side towards J less that towards I, so that force times
 /// deformation is its work. Springs are condensed: with C the motion of the ends that stands for
 /// unit jumps, k' = k - k C (K0 + C' k C)^-1 C' k. P-Delta is the couple of the axial force and the
-/// drift of the chord, N / L across, which no plastic deformation changes, and of its rigid ends, N
-/// times the turn of each.
+/// drift of the chord, N / L across, which no plastic deformation changes, of its rigid ends, N
+/// times the turn of each, and inside the element of the axial force and the kinks of its hinges:
+/// they lie off the chord.
 class CPushElement {
 public:
     CPushElement(const T_FRAME& frame, std::size_t element,
@@ -49,6 +50,9 @@ public:
     /// Force of component c that a unit plastic deformation of component d takes away while the
     /// nodes stand still.
     double Own(std::size_t c, std::size_t d) const { return m_own[c * Size() + d]; }
+    /// How far off the chord component c lies by a unit kink at component d; 0 of other components
+    /// and at the ends. Times the tension it is what P-Delta adds to Own.
+    double Kink(std::size_t c, std::size_t d) const;
 
     /// axial: the tension that it would have between clamped ends from initial strains.
     T_ELEMENT_LOADS Loads(std::span<const T_SPAN_LOAD> loads, double axial) const;
@@ -61,7 +65,7 @@ public:
     T_VEC12 AtNodes(const T_VEC12& displacement, std::span<const double> plastic, double coupled,
                     double& tension, std::span<double> own = {}) const;
     /// Internal forces at fraction s, by the same.
-    T_VEC6 Inside(const T_VEC12& displacement, std::span<const double> plastic,
+    T_VEC6 Inside(const T_VEC12& displacement, std::span<const double> plastic, double coupled,
                   const T_VEC12& loads, std::span<const T_SPAN_LOAD> span, double s) const;
 
     /// Mean axial force of loads between clamped ends, tension positive; 0 of links and springs.
@@ -74,6 +78,7 @@ private:
     void MakeInfluence();
     void MakeBasic();
     double AxialStiffness() const;
+    double OffChord(double s, std::size_t d) const;
     T_VEC12 Ends(const T_VEC12& displacement, std::span<const double> plastic,
                  const T_VEC12& loads) const;
     T_VEC12 Across(const T_VEC12& displacement, double tension) const;

@@ -24,7 +24,7 @@ bool CPushPath::IsFoldable(std::size_t f) const
 {
     const CPushFlow& flow = m_flows.flows[f];
     return Backbone(f).On() == ON::Virgin && Backbone(f).Slope() > 0.0 && flow.Rows().size() == 1 &&
-           !flow.HangsOnAxial();
+           !flow.HangsOnAxial() && !m_structure.Kinks(flow.Rows()[0]);
 }
 
 bool CPushPath::IsFolded(std::size_t f) const

@@ -305,8 +305,12 @@ CPushStructure::T_FAULT CPushStructure::Columns(std::span<const std::size_t> row
             column[r] = sum;
         }
         const std::size_t e = m_rows[rows[c]].element;
-        for (const std::size_t r : m_rowsOf[e])
+        for (const std::size_t r : m_rowsOf[e]) {
             column[r] -= m_elements[e].Own(m_rows[r].component, m_rows[rows[c]].component);
+            if (!m_tension.empty())
+                column[r] -= m_tension[e] *
+                             m_elements[e].Kink(m_rows[r].component, m_rows[rows[c]].component);
+        }
         for (std::size_t p = 0; p < probes.size(); ++p)
             values[c * probes.size() + p] = Value(probes[p], own);
     }

@@ -80,6 +80,12 @@ public:
     {
         return m_elements[m_rows[row].element].Own(m_rows[row].component, m_rows[row].component);
     }
+    /// The plastic deformation of a row kinks a member with P-Delta: no spring can stand for it.
+    bool Kinks(std::size_t row) const
+    {
+        const std::size_t e = m_rows[row].element, c = m_rows[row].component;
+        return !m_tension.empty() && m_tension[e] != 0.0 && m_elements[e].Kink(c, c) != 0.0;
+    }
     /// Forces of all rows and values of the probes by unit plastic deformations of these rows, one
     /// column after the other, solved in one block.
     T_FAULT Columns(std::span<const std::size_t> rows, std::span<const T_PROBE> probes,

@@ -70,6 +70,24 @@ std::vector<T_END_CASE> EndCases()
     arm.model.pDelta = P_DELTA::Initial;
     arm.model.initial = PushTo(1.0).loads;
     arm.model.initial.nodal[0].load = {0, 0, -10, 0, 0, 0};
+    // A strut between two pins, pressed by 10, its hinge at half its length: P 2 / 4 + 10 p 2 / 4 =
+    // 100 where the hinge has turned by p, and its foot by P 4 / 1600 + p / 2.
+    T_END_CASE& strut = add("hinge inside a strut", ideal, PUSH_OUTCOME::Reached, 190.0, 0.975);
+    strut.model.frame.nodes[0].fixed[4] = false;
+    Fix(strut.model.frame, 1, {0, 1});
+    strut.model.hinges[0].at = 0.5;
+    strut.model.pDelta = P_DELTA::Initial;
+    strut.model.initial = PushTo(1.0).loads;
+    strut.model.initial.nodal[0].load = {0, 0, -10, 0, 0, 0};
+    T_BEAM_LOAD across;
+    across.type = BEAM_LOAD::Point;
+    across.w = {1.0, 0.0};
+    across.at = {0.5, 0.0};
+    strut.stage.loads.nodal.clear();
+    strut.stage.loads.beam.push_back(across);
+    strut.stage.node = 0;
+    strut.stage.direction = 4;
+    strut.stage.target = 0.975;
     T_END_CASE& elastic = add("no hinges, back", Column(), PUSH_OUTCOME::Reached, -3.75, -0.1);
     elastic.stage.target = -0.1;
     elastic.stage.steps = {0.5, 1.0};
