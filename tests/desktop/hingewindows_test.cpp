@@ -1,6 +1,7 @@
 #include "desktoptest.h"
 
 #include "hingetools.h"
+#include "qm_rps/section/sectionvalues.h"
 #include "qm_ui/plot/plotwidget.h"
 
 #include <QComboBox>
