@@ -1,11 +1,9 @@
 #include "desktoptest.h"
 
 #include "hingetools.h"
-#include "qm_rps/section/sectionvalues.h"
 #include "qm_ui/plot/plotwidget.h"
 
 #include <QComboBox>
-#include <QFile>
 
 using namespace desktop_test;
 
@@ -389,38 +387,4 @@ TEST_F(HingeWindows, TheOlderTableEditsAFemaCurveAndAsksBeforeEditsAreLost)
     });
     Run("IDS_QM_UI_HINGE_TABLE");
     EXPECT_EQ(-0.8, CurveOf<T_SKEL_FEMA>(Type(kBeam), 4).sides.neg.D.strength);
-}
-
-// The numbers of the column 40x40 are those of the command on the same file.
-TEST_F(HingeWindows, CurvesOfASectionFollowItsOptionsAndAreExported)
-{
-    ASSERT_TRUE(Open("rc-frame-code-hinges"));
-    const QString file = File("points.csv");
-    CAnswers answers({Visit([&](CDialogWindow& curves) {
-        const auto plot = [&](const char* page) -> const T_PLOT& {
-            return dynamic_cast<CPlotWidget*>(Field(curves, page))->Plot();
-        };
-        const double before = plot("interaction.picture").series.at(0).x.at(20);
-        ChooseIndex(Field(curves, "values"), static_cast<int>(SECTION_VALUES::Design));
-        EXPECT_LT(plot("interaction.picture").series.at(0).x.at(20), 0.95 * before);
-        Enter(curves, "axial", "0 400");
-        EXPECT_EQ(4U, plot("curvature.picture").series.size()); // each with its idealisation
-        EXPECT_EQ(2U, plot("surface.picture").series.size());
-        Enter(curves, "axial", "0 many");
-        EXPECT_TRUE(plot("curvature.picture").series.empty());
-        EXPECT_FALSE(plot("interaction.picture").series.empty());
-        Enter(curves, "axial", "0");
-        ChooseIndex(Field(curves, "law"), 1); // design values and the block: refused
-        EXPECT_TRUE(plot("capacity.picture").series.empty());
-        ChooseIndex(Field(curves, "law"), 0);
-        ChooseIndex(Field(curves, "section"), 1);
-        EXPECT_FALSE(plot("capacity.picture").series.empty());
-        AnswerFileName(file);
-        Push(curves, "interaction.export");
-    })});
-    Run("IDS_QM_UI_SECC_CMD");
-    QFile csv(file);
-    ASSERT_TRUE(csv.open(QIODevice::ReadOnly));
-    EXPECT_EQ(41, csv.readAll().count('\n')); // a head and 40 points
-    EXPECT_FALSE(Modified());
 }
