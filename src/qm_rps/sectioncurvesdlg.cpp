@@ -63,7 +63,7 @@ const CSectionCurvesDlg::T_PAGE& CSectionCurvesDlg::Page(SECTION_TASK task)
     if (task == SECTION_TASK::Surface && request.axial.size() < 2) request.axial.clear();
     if (m_pair < 0) {
         page.reason = Say("IDS_QM_SECC_NONE");
-    } else if (!readable) {
+    } else if (!readable && task != SECTION_TASK::Interaction) { // which asks for none
         page.reason = Say("IDS_QM_SECC_LIST_NUMBER", m_axial);
     } else {
         const T_SECTION_PAIR& pair = m_pairs[static_cast<std::size_t>(m_pair)];
