@@ -289,6 +289,9 @@ void CaseFields(V& v, T_FIELD_REF<V, T_GENERATED> r)
     v.Opt("axial_I", r.axial.I, 0.0, kDimForce);
     v.Opt("axial_J", r.axial.J, 0.0, kDimForce);
     v.Need("inputs", r.inputs);
+    v.Opt("pushed", r.pushed, {});
+    v.Opt("axial_range", r.axialRange, {});
+    v.Opt("tie", r.tie, 0.0);
 }
 
 /// Dimensions of a component's curve in a definition.

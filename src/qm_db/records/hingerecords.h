@@ -200,6 +200,12 @@ struct T_GENERATED {
     /// What went into it, in SI, in the order of the generator: tells whether section, material,
     /// member or loads have changed since.
     std::vector<double> inputs{};
+    /// V and M / V of the I-end, then of the J-end, for each axis of bending (y before z), as a
+    /// push gave them; SI. Empty: of the strengths at both ends, shear span half of the clear
+    /// length.
+    std::vector<double> pushed{};
+    std::vector<double> axialRange{}; // curves by axial force: from, to; SI; empty: none
+    double tie = 0.0;                 // strength of what ties a spandrel, SI
     bool operator==(const T_GENERATED&) const = default;
 };
 

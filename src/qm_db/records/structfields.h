@@ -125,6 +125,21 @@ void CaseFields(V& v, T_FIELD_REF<V, T_MATL_MEAN> r)
 }
 
 template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_MATL_MASONRY> r)
+{
+    v.Opt("tau0", r.tau0, 0.0, kDimStress);
+    v.Check("tau0", r.tau0 >= 0.0, kNotNegative);
+    v.Opt("fv0", r.fv0, 0.0, kDimStress);
+    v.Check("fv0", r.fv0 >= 0.0, kNotNegative);
+    v.Opt("fb", r.fb, 0.0, kDimStress);
+    v.Check("fb", r.fb >= 0.0, kNotNegative);
+    v.EnumOpt("bond", r.bond, BOND_KIND::Irregular, kBondNames, "IDS_QM_CHOICE_BOND");
+    v.Opt("interlocking", r.interlocking, 1.0);
+    v.Check("interlocking", r.interlocking >= 0.0, kNotNegative);
+    v.Opt("hollow_blocks", r.hollowBlocks, false);
+}
+
+template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_MATL_D> r)
 {
     v.EnumOpt("type", r.type, MATL_CLASS::Steel, kMatlNames, "IDS_QM_CHOICE_MATERIAL");
@@ -144,6 +159,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_MATL_D> r)
     v.EnumIf("knowledge", r.knowledge, kKnowledgeNames, "IDS_QM_CHOICE_KNOWLEDGE");
     v.OptIf("confidence_factor", r.confidence);
     v.Check("confidence_factor", r.confidence.value_or(1.0) >= 1.0, "IDS_QM_CASE_CONFIDENCE");
+    v.PartIf("masonry", r.masonry);
 }
 
 template <class V>

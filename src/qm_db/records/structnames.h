@@ -12,6 +12,8 @@ inline constexpr std::array<const char*, 3> kPlaneNames{"XY", "XZ", "YZ"};
 /// By STIRRUP_HOOKS, by MATL_KNOWLEDGE.
 inline constexpr std::array<const char*, 3> kHookNames{"135", "90", "none"};
 inline constexpr std::array<const char*, 3> kKnowledgeNames{"KL1", "KL2", "KL3"};
+/// By BOND_KIND.
+inline constexpr std::array<const char*, 2> kBondNames{"irregular", "regular"};
 
 inline constexpr std::array<const char*, 2> kLoadAxesNames{"local", "global"};
 inline constexpr std::array<const char*, 3> kLoadDirectionNames{"x", "y", "z"};

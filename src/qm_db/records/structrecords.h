@@ -22,12 +22,24 @@ enum class MATL_CLASS { Concrete, Steel, Composite, Masonry };
 
 /// Mean or expected strengths of an existing material, as tests or its age give them.
 struct T_MATL_MEAN {
-    double fc = 0.0;  // of concrete
-    double fy = 0.0;  // of the bars
+    double fc = 0.0;  // of concrete or masonry
+    double fy = 0.0;  // of the bars, or of steel
     double fyw = 0.0; // of the stirrups; 0: as the bars
     bool operator==(const T_MATL_MEAN&) const = default;
 };
 enum class MATL_KNOWLEDGE { KL1, KL2, KL3 };
+
+enum class BOND_KIND { Irregular, Regular };
+/// Mean strengths of existing masonry in shear.
+struct T_MATL_MASONRY {
+    double tau0 = 0.0; // of an irregular bond, diagonal cracks
+    double fv0 = 0.0;  // of the joints without compression; 0: not given
+    double fb = 0.0;   // compressive, of the blocks; 0: not given
+    BOND_KIND bond = BOND_KIND::Irregular;
+    double interlocking = 1.0; // phi of a regular bond: height of a course over the overlap
+    bool hollowBlocks = false; // modern ones
+    bool operator==(const T_MATL_MASONRY&) const = default;
+};
 
 struct T_MATL_D {
     std::string name;
@@ -44,6 +56,7 @@ struct T_MATL_D {
     std::optional<T_MATL_MEAN> mean{};
     std::optional<MATL_KNOWLEDGE> knowledge{};
     std::optional<double> confidence{}; // goes before that of the knowledge
+    std::optional<T_MATL_MASONRY> masonry{};
     bool operator==(const T_MATL_D&) const = default;
 };
 
