@@ -20,6 +20,9 @@ void AddGenerate(CLI::App* hinge, EXIT_CODE& code)
     sub->add_flag("--all", o->all, Say("IDS_QM_HELP_HINGE_ALL"));
     sub->add_option("--level", o->level, Say("IDS_QM_HELP_HINGE_LEVEL"))
         ->check(CLI::IsMember({"primary", "secondary"}));
+    sub->add_option("--push", o->push, Say("IDS_QM_HELP_HINGE_PUSH"));
+    sub->add_option("--axial-range", o->axialRange, Say("IDS_QM_HELP_HINGE_AXIAL_RANGE"));
+    sub->add_option("--tie", o->tie, Say("IDS_QM_HELP_HINGE_TIE"))->check(CLI::PositiveNumber);
     sub->add_flag("--keep-going", o->keepGoing, Say("IDS_QM_HELP_HINGE_KEEP_GOING"));
     sub->add_flag("--trace", o->trace, Say("IDS_QM_HELP_HINGE_TRACE"));
     AddJson(sub, o->json);

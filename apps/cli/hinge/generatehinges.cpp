@@ -147,13 +147,62 @@ std::string WarningsText(const T_CODE_HINGES& hinges)
     return text;
 }
 
+/// "-100..800" in the file's units; nothing: it is no such text.
+std::optional<std::vector<double>> RangeOf(const std::string& text, const T_UNITS& units)
+{
+    const std::size_t dots = text.find("..");
+    if (dots == std::string::npos) return {};
+    const std::optional<double> from = ParseFinite(text.substr(0, dots));
+    const std::optional<double> to = ParseFinite(text.substr(dots + 2));
+    if (!from || !to || !(*from < *to)) return {};
+    return std::vector<double>{ToSi(*from, units, kDimForce), ToSi(*to, units, kDimForce)};
+}
+
+/// What the document's units and load cases decide.
+EXIT_CODE ReadRequest(const T_HINGE_GENERATE_OPTIONS& o, CDBDoc& doc, T_CODE_REQUEST& request,
+                      int& loadCase)
+{
+    const T_UNITS units = doc.Unit().Units();
+    request.options.tie = ToSi(o.tie, units, kDimForce);
+    if (!o.axialRange.empty()) {
+        const auto range = RangeOf(o.axialRange, units);
+        if (!range || IsChordCode(request.options.code))
+            return Complain(
+                EXIT_CODE::Usage,
+                Say(range ? "IDS_QM_GEN_RANGE_FEMA" : "IDS_QM_GEN_RANGE", o.axialRange));
+        request.options.axialRange = *range;
+    }
+    if (o.push.empty()) return EXIT_CODE::Done;
+    const T_MODEL& model = doc.Data().Model();
+    const auto found = std::ranges::find_if(
+        model.pushovers, [&](const auto& entry) { return entry.second.name == o.push; });
+    if (found == model.pushovers.end())
+        return Complain(EXIT_CODE::BadInput, Say("IDS_QM_GEN_NO_PUSH", o.push));
+    loadCase = found->first;
+    return EXIT_CODE::Done;
+}
+
+/// "push 1: V of element 4 by 31.2 % (74.6 -> 108.4), target reached".
+std::string IterationsText(const T_CODE_HINGES& hinges, const T_UNITS& units)
+{
+    std::string text;
+    int number = 0;
+    for (const T_CODE_ITERATION& it : hinges.iterations)
+        text += Say("IDS_QM_GEN_ITERATION", std::to_string(++number),
+                    std::to_string(it.change.element), FormatText("%.3g", 100.0 * it.change.change),
+                    Number(FromSi(it.change.before, units, kDimForce)) + " -> " +
+                        Number(FromSi(it.change.now, units, kDimForce))) +
+                ", " + it.outcome + "\n";
+    return text;
+}
+
 EXIT_CODE CheckOptions(const T_HINGE_GENERATE_OPTIONS& o, T_CODE_REQUEST& request)
 {
     if (o.all == !o.elements.empty())
         return Complain(EXIT_CODE::Usage, Say("IDS_QM_GEN_ONE_OF", "--all", "--elements"));
     const auto code = std::ranges::find(kHingeCodeNames, o.code);
-    request.code = static_cast<HINGE_CODE>(code - kHingeCodeNames.begin());
-    request.secondary = o.level == "secondary";
+    request.options.code = static_cast<HINGE_CODE>(code - kHingeCodeNames.begin());
+    request.options.secondary = o.level == "secondary";
     request.keepGoing = o.keepGoing;
     const std::optional<std::vector<int>> elements = ParseElementList(o.elements);
     if (!elements)
@@ -173,12 +222,17 @@ EXIT_CODE RunHingeGenerate(const T_HINGE_GENERATE_OPTIONS& o)
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
     T_CODE_HINGES hinges;
     T_HINGE_REFUSAL refusal;
-    if (!CCodeHinges(doc).Generate(request, hinges, refusal))
+    int loadCase = 0;
+    if (const EXIT_CODE code = ReadRequest(o, doc, request, loadCase); code != EXIT_CODE::Done)
+        return code;
+    CCodeHinges generator(doc);
+    if (!(loadCase == 0 ? generator.Generate(request, hinges, refusal)
+                        : generator.GenerateFromPush(request, loadCase, hinges, refusal)))
         return Complain(EXIT_CODE::BadInput, o.file + ": " + refusal.text);
     const T_UNITS units = doc.Unit().Units();
     if (o.json != "-") {
-        const bool chord = IsChordCode(request.code);
-        const std::string text = Table(hinges, chord, units) +
+        const bool chord = IsChordCode(request.options.code);
+        const std::string text = IterationsText(hinges, units) + Table(hinges, chord, units) +
                                  (o.trace ? TraceText(hinges, units) : "") + WarningsText(hinges);
         std::fputs(text.c_str(), stdout);
     }

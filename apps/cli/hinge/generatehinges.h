@@ -13,6 +13,9 @@ struct T_HINGE_GENERATE_OPTIONS {
     bool all = false;
     std::string level = "primary"; // or "secondary"
     bool keepGoing = false;
+    std::string push;       // load case whose V counts
+    std::string axialRange; // "from..to"
+    double tie = 0.0;       // of spandrels, file's units
     std::string json, out;
     bool trace = false;
     bool overwrite = false;

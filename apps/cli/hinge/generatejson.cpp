@@ -58,6 +58,15 @@ std::string CodeHingesJson(const T_CODE_HINGES& hinges, const std::string& code,
     w.Member("force", NameOf(units.force)).Member("length", NameOf(units.length));
     w.End();
     WriteWarnings(w, hinges.warnings);
+    w.Key("pushes").List();
+    for (const T_CODE_ITERATION& it : hinges.iterations) {
+        w.Object(kJsonOneLine);
+        w.Member("element", it.change.element).Member("change", it.change.change);
+        w.Member("shear_before", FromSi(it.change.before, units, kDimForce));
+        w.Member("shear", FromSi(it.change.now, units, kDimForce)).Member("outcome", it.outcome);
+        w.End();
+    }
+    w.End();
     w.Key("types").List();
     std::vector<const T_CODE_HINGE*> done;
     for (const T_CODE_ELEMENT& first : hinges.elements) {

@@ -30,8 +30,8 @@ double ShapeFactor(const T_PIER& p, CCodeSheet& sheet)
 }
 
 /// Sliding over the compressed length l' = 3 (l/2 - M/N) <= l with M = V h0, solved for V where
-/// the stress is cohesion + 0.4 N/(l' t).
-double SlidingStrength(const T_PIER& p, CCodeSheet& sheet)
+/// the stress is cohesion + 0.4 N/(l' t), not above the limit; 0: there is none.
+double SlidingForce(const T_PIER& p, double limit)
 {
     const double fv0 = p.fv0 / p.confidence, friction = kFriction * p.axial;
     const double turn = 3.0 * p.shearSpan * p.thickness / p.axial;
@@ -40,12 +40,17 @@ double SlidingStrength(const T_PIER& p, CCodeSheet& sheet)
         return std::min(cracked, Area(p) * stress + constant);
     };
     double v = solved(fv0, friction);
-    if (p.fb > 0.0) v = std::min(v, solved(0.065 * p.fb / kGammaM, 0.0));
-    v = std::min(v, p.axial * p.length / (2.0 * p.shearSpan)); // nothing is compressed any more
+    if (limit > 0.0) v = std::min(v, solved(limit, 0.0));
+    return std::min(v, p.axial * p.length / (2.0 * p.shearSpan)); // nothing is compressed any more
+}
+
+double SlidingStrength(const T_PIER& p, double limit, const char* clause, const char* text,
+                       CODE_MARK mark, CCodeSheet& sheet)
+{
+    const double v = SlidingForce(p, limit);
     const double length = std::min(p.length, 3.0 * (p.length / 2.0 - v * p.shearSpan / p.axial));
-    sheet.Put("l'", length, kDimLength, kSliding, "3 (l/2 - V h0/N) <= l", K);
-    return sheet.Put("Vs", v, kDimForce, kSliding,
-                     "l' t min(fv0 + 0.4 N/(l' t); 0.065 fb/0.7); l' >= 0", S1);
+    sheet.Put("l'", length, kDimLength, clause, "3 (l/2 - V h0/N) <= l", K);
+    return sheet.Put("Vs", v, kDimForce, clause, text, mark);
 }
 
 double IrregularStrength(const T_PIER& p, double stress, CCodeSheet& sheet)
@@ -72,28 +77,44 @@ double RegularStrength(const T_PIER& p, double stress, CCodeSheet& sheet)
                      R);
 }
 
-double DriftOf(const T_PIER& p, PIER_MODE mode)
+double NtcSliding(const T_PIER& p, CCodeSheet& sheet)
 {
-    if (mode == PIER_MODE::Flexure) return 0.01;
-    return mode == PIER_MODE::Diagonal && p.hollowBlocks ? 0.004 : 0.005;
+    return SlidingStrength(p, 0.065 * p.fb / kGammaM, kSliding,
+                           "l' t min(fv0 + 0.4 N/(l' t); 0.065 fb/0.7); l' >= 0", S1, sheet);
 }
 
-bool Sound(const T_PIER& p, CCodeSheet& sheet)
+bool SoundPier(const T_PIER& p, CCodeSheet& sheet)
 {
     sheet.Positive({{"length", p.length}, {"thickness", p.thickness}, {"height", p.height}});
     sheet.Positive({{"shearSpan", p.shearSpan}, {"axial", p.axial}, {"fm", p.fm}});
     sheet.NotNegative({{"fv0", p.fv0}, {"fb", p.fb}});
-    if (p.bond == MASONRY_BOND::Irregular)
-        sheet.Positive({{"tau0", p.tau0}});
-    else
-        sheet.Positive({{"fv0", p.fv0}});
-    sheet.NotNegative({{"interlocking", p.interlocking}});
     sheet.Within("confidence", p.confidence, 1.0, 2.0);
     if (sheet.Sound()) sheet.Within("axial", p.axial, 0.0, 0.85 * p.fm / p.confidence * Area(p));
     return sheet.Sound();
 }
 
+bool Sound(const T_PIER& p, CCodeSheet& sheet)
+{
+    if (p.bond == MASONRY_BOND::Irregular)
+        sheet.Positive({{"tau0", p.tau0}});
+    else
+        sheet.Positive({{"fv0", p.fv0}});
+    sheet.NotNegative({{"interlocking", p.interlocking}});
+    return SoundPier(p, sheet);
+}
+
 } // namespace
+
+double NtcPierDrift(PIER_MODE mode, bool hollowBlocks, CCodeSheet& sheet)
+{
+    const bool hollow = mode == PIER_MODE::Diagonal && hollowBlocks;
+    return sheet.Put("du/h",
+                     mode == PIER_MODE::Flexure ? 0.01
+                     : hollow                   ? 0.004
+                                                : 0.005,
+                     kDrift, "flexure 0.01; sliding, diagonal 0.005; hollow blocks, diagonal 0.004",
+                     S1);
+}
 
 std::optional<T_PIER_STRENGTH> NtcPier(const T_PIER& pier, CCodeSheet& sheet)
 {
@@ -110,13 +131,50 @@ std::optional<T_PIER_STRENGTH> NtcPier(const T_PIER& pier, CCodeSheet& sheet)
     const auto take = [&](PIER_MODE mode, double v) {
         if (v < s.strength) s.mode = mode, s.strength = v;
     };
-    if (pier.fv0 > 0.0) take(PIER_MODE::Sliding, *(s.sliding = SlidingStrength(pier, sheet)));
+    if (pier.fv0 > 0.0) take(PIER_MODE::Sliding, *(s.sliding = NtcSliding(pier, sheet)));
     s.diagonal = pier.bond == MASONRY_BOND::Regular ? RegularStrength(pier, stress, sheet)
                                                     : IrregularStrength(pier, stress, sheet);
     take(PIER_MODE::Diagonal, s.diagonal);
-    s.drift = sheet.Put("du/h", DriftOf(pier, s.mode), kDrift,
-                        "flexure 0.01; sliding, diagonal 0.005; hollow blocks, diagonal 0.004", S1);
+    s.drift = NtcPierDrift(s.mode, pier.hollowBlocks, sheet);
     return sheet.Sound() ? std::optional(s) : std::nullopt;
+}
+
+std::optional<T_PIER_STRENGTH> AnnexCPier(const T_PIER& pier, CCodeSheet& sheet)
+{
+    constexpr const char* kBending = "EN 1998-3 (C.1)";
+    constexpr const char* kShear = "EN 1998-3 (C.3)";
+    sheet.Positive({{"fv0", pier.fv0}});
+    if (!SoundPier(pier, sheet)) return {};
+    T_PIER_STRENGTH s;
+    const double nu = sheet.Put("nu_d", pier.axial / (Area(pier) * pier.fm / pier.confidence),
+                                kBending, "N/(D t fm/CF)", R);
+    s.flexure =
+        sheet.Put("Vf", pier.length * pier.axial / (2.0 * pier.shearSpan) * (1.0 - 1.15 * nu),
+                  kDimForce, kBending, "D N/(2 H0) (1 - 1.15 nu_d)", R);
+    s.moment = sheet.Put("Mu", s.flexure * pier.shearSpan, kDimMoment, kBending, "Vf H0", K);
+    if (!sheet.Positive({{"Mu", s.moment}})) return {};
+    s.sliding = SlidingStrength(pier, 0.065 * pier.fm / pier.confidence, kShear,
+                                "D' t min(fvm0 + 0.4 N/(D' t); 0.065 fm)", R, sheet);
+    s.mode = *s.sliding < s.flexure ? PIER_MODE::Sliding : PIER_MODE::Flexure;
+    s.strength = std::min(s.flexure, *s.sliding);
+    return s;
+}
+
+std::optional<T_SPANDREL_STRENGTH> NtcSpandrel(const T_SPANDREL& p, CCodeSheet& sheet)
+{
+    constexpr const char* kClause = "NTC 2018 7.8.2.2.4";
+    sheet.Positive({{"depth", p.depth}, {"thickness", p.thickness}, {"length", p.length}});
+    sheet.Positive({{"tie", p.tie}, {"fm", p.fm}, {"fv0", p.fv0}});
+    if (!sheet.Within("confidence", p.confidence, 1.0, 2.0)) return {};
+    const double area = p.depth * p.thickness, fd = p.fm / p.confidence;
+    const double force = sheet.Put("Hp", std::min(p.tie, 0.4 * fd * area), kDimForce, kClause,
+                                   "min(tie; 0.4 fhd h t)", R);
+    T_SPANDREL_STRENGTH s;
+    s.moment = sheet.Put("Mu", force * p.depth / 2.0 * (1.0 - force / (0.85 * fd * area)),
+                         kDimMoment, kClause, "Hp h/2 (1 - Hp/(0.85 fhd h t))", R);
+    s.shear = sheet.Put("Vt", area * p.fv0 / p.confidence, kDimForce, kClause, "h t fvd0", R);
+    s.drift = sheet.Put("theta_u", 0.015, kDrift, "spandrel with a tie 0.015", R);
+    return s;
 }
 
 std::optional<T_PIER_DRIFTS> AnnexCDrifts(double H0, double D, bool flexure, bool secondary,

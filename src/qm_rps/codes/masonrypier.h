@@ -1,5 +1,5 @@
-// Piers of existing masonry: in-plane strength and drifts by NTC 2018 with the Circolare 2019, and
-// the drifts of EN 1998-3 Annex C.
+// Piers and spandrels of existing masonry: in-plane strength and drifts by NTC 2018 with the
+// Circolare 2019, and piers by EN 1998-3 Annex C.
 #pragma once
 
 #include "qm_rps/codes/codesheet.h"
@@ -31,6 +31,27 @@ struct T_PIER_STRENGTH {
     double drift = 0.0;    // ultimate, over the height, of the mode that governs
 };
 std::optional<T_PIER_STRENGTH> NtcPier(const T_PIER& pier, CCodeSheet& sheet);
+/// Ultimate drift of a mode.
+double NtcPierDrift(PIER_MODE mode, bool hollowBlocks, CCodeSheet& sheet);
+
+/// EN 1998-3 Annex C.2, C.3: flexure and sliding; bond and tau0 do not count, there is no
+/// diagonal, and drifts are those of AnnexCDrifts.
+std::optional<T_PIER_STRENGTH> AnnexCPier(const T_PIER& pier, CCodeSheet& sheet);
+
+/// NTC 2018 7.8.2.2.4, 7.8.2.2.5: a spandrel between piers, tied by something that carries tension
+/// (tie beam, tie rod).
+struct T_SPANDREL {
+    double depth = 0.0, thickness = 0.0, length = 0.0; // m
+    double tie = 0.0;                                  // strength of the tie, N
+    double fm = 0.0;                                   // mean compressive strength, horizontal, Pa
+    double fv0 = 0.0;                                  // mean shear strength without compression
+    double confidence = 1.0;
+};
+struct T_SPANDREL_STRENGTH {
+    double moment = 0.0, shear = 0.0; // Mu; Vt
+    double drift = 0.0;               // ultimate, of the chord
+};
+std::optional<T_SPANDREL_STRENGTH> NtcSpandrel(const T_SPANDREL& spandrel, CCodeSheet& sheet);
 
 /// EN 1998-3 Annex C: drifts of SD and NC; H0 is the height to the inflection point, D the depth.
 struct T_PIER_DRIFTS {

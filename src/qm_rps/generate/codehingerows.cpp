@@ -32,37 +32,49 @@ std::string Power(std::string_view unit, int exponent)
     return std::string(unit) + (exponent == 1 ? "" : std::to_string(exponent));
 }
 
+/// Rows of both ends of a component at axial forces.
+void AppendRows(const T_CODE_ELEMENT& element, const T_CODE_COMPONENT& b,
+                const T_ENDS<T_SIDES<T_CODE_SIDE>>& ends, const T_ENDS<double>& axial,
+                std::vector<T_CODE_ROW_OF_HINGE>& rows)
+{
+    const bool middle = b.location == HINGE_LOCATION::Center;
+    const bool same = b.location == HINGE_LOCATION::BothEnds && Alike(ends.I.pos, ends.J.pos) &&
+                      Alike(ends.I.neg, ends.J.neg);
+    for (const bool atI : {true, false}) {
+        if (b.location == (atI ? HINGE_LOCATION::JEnd : HINGE_LOCATION::IEnd)) continue;
+        if ((same || middle) && !atI) continue;
+        const T_SIDES<T_CODE_SIDE>& sides = atI ? ends.I : ends.J;
+        const auto put = [&](const char* side, bool positive) {
+            const bool own = positive != IsSectionSignOpposite(b.component);
+            rows.push_back({element.member.element, element.member.kind,
+                            middle ? "C"
+                            : same ? "I, J"
+                            : atI  ? "I"
+                                   : "J",
+                            b.component, side,
+                            !element.member.HasAxial() ? 0.0
+                            : atI                      ? axial.I
+                                                       : axial.J,
+                            own ? &sides.pos : &sides.neg});
+        };
+        if (Alike(sides.pos, sides.neg)) {
+            put("+-", true);
+        } else {
+            put("+", true);
+            put("-", false);
+        }
+    }
+}
+
 } // namespace
 
 std::vector<T_CODE_ROW_OF_HINGE> HingeRows(const T_CODE_ELEMENT& element)
 {
     std::vector<T_CODE_ROW_OF_HINGE> rows;
     for (const T_CODE_COMPONENT& b : element.hinge->components) {
-        const auto at = static_cast<std::size_t>(b.component);
-        const HINGE_LOCATION location = element.hinge->type.components[at].location;
-        const bool middle = location == HINGE_LOCATION::Center;
-        const bool same = location == HINGE_LOCATION::BothEnds &&
-                          Alike(b.ends.I.pos, b.ends.J.pos) && Alike(b.ends.I.neg, b.ends.J.neg);
-        const auto put = [&](const char* end, bool atI, const char* side, bool positive) {
-            const auto& sides = atI ? b.ends.I : b.ends.J;
-            const bool own = positive != IsSectionSignOpposite(b.component);
-            const double axial = atI ? element.member.axial.I : element.member.axial.J;
-            rows.push_back({element.member.element, element.member.kind, end, b.component, side,
-                            element.member.HasAxial() ? axial : 0.0,
-                            own ? &sides.pos : &sides.neg});
-        };
-        for (const bool atI : {true, false}) {
-            if (location == (atI ? HINGE_LOCATION::JEnd : HINGE_LOCATION::IEnd)) continue;
-            if ((same || middle) && !atI) continue;
-            const char* const end = middle ? "C" : same ? "I, J" : atI ? "I" : "J";
-            const auto& sides = atI ? b.ends.I : b.ends.J;
-            if (Alike(sides.pos, sides.neg)) {
-                put(end, atI, "+-", true);
-            } else {
-                put(end, atI, "+", true);
-                put(end, atI, "-", false);
-            }
-        }
+        AppendRows(element, b, b.ends, element.member.axial, rows);
+        for (const T_CODE_AXIAL& at : b.byAxial)
+            AppendRows(element, b, at.ends, {at.axial, at.axial}, rows);
     }
     return rows;
 }

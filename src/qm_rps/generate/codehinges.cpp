@@ -64,6 +64,25 @@ void EraseOld(CDBDoc& doc, const std::set<int>& elements, CEditScope& edit)
         (void)edit.Erase<T_PHGT_D>(key);
 }
 
+/// V that the hinges were made with, as PushedShears has it (M / V stays 0).
+std::map<int, std::vector<double>> ShearsOf(const T_CODE_HINGES& hinges)
+{
+    std::map<int, std::vector<double>> out;
+    for (const T_CODE_ELEMENT& element : hinges.elements) {
+        const auto& axes = element.member.bending;
+        std::vector<double> values(4 * axes.size());
+        for (const T_CODE_COMPONENT& c : element.hinge->components) {
+            const auto axis = std::ranges::find(axes, c.component) - axes.begin();
+            const auto place = 4 * static_cast<std::size_t>(axis);
+            if (place >= values.size()) continue;
+            values[place] = c.ends.I.pos.shear;
+            values[place + 2] = c.ends.J.pos.shear;
+        }
+        out.emplace(element.member.element, std::move(values));
+    }
+    return out;
+}
+
 } // namespace
 
 int CCodeHinges::Analyse(std::string& reason)
@@ -91,6 +110,8 @@ int CCodeHinges::Group(const T_CODE_REQUEST& request, std::vector<T_GROUP>& grou
             if (!refuse(id, reason)) return 0;
             continue;
         }
+        if (const auto pushed = request.pushed.find(id); pushed != request.pushed.end())
+            member.pushed = pushed->second;
         const std::vector<double> inputs = InputsOf(model, member);
         auto& same = alike[{member.section, member.material}];
         auto found = std::ranges::find_if(
@@ -99,7 +120,7 @@ int CCodeHinges::Group(const T_CODE_REQUEST& request, std::vector<T_GROUP>& grou
             T_GROUP& group = groups.emplace_back();
             group.inputs = inputs;
             auto hinge = std::make_shared<T_CODE_HINGE>();
-            if (MakeCodeHinge(model, member, request.code, request.secondary, *hinge, group.reason))
+            if (MakeCodeHinge(model, member, request.options, *hinge, group.reason))
                 group.hinge = std::move(hinge);
             same.push_back(groups.size() - 1);
             found = same.end() - 1;
@@ -121,7 +142,7 @@ int CCodeHinges::Group(const T_CODE_REQUEST& request, std::vector<T_GROUP>& grou
 int CCodeHinges::Store(std::vector<T_GROUP>& groups, const T_CODE_REQUEST& request,
                        T_HINGE_REFUSAL& refusal)
 {
-    CEditScope edit(m_doc, "hinges of a code");
+    CEditScope edit(m_doc, "hinges of a code", EDIT_STEP::Join);
     std::set<int> elements;
     for (const T_GROUP& group : groups)
         elements.insert(group.elements.begin(), group.elements.end());
@@ -136,7 +157,7 @@ int CCodeHinges::Store(std::vector<T_GROUP>& groups, const T_CODE_REQUEST& reque
     for (T_GROUP& group : groups) {
         const T_ELEM_D& first = model.elements.at(group.elements.front());
         T_PHGT_D& type = group.hinge->type;
-        type.name = FreeName(kHingeCodeNames[static_cast<std::size_t>(request.code)] +
+        type.name = FreeName(kHingeCodeNames[static_cast<std::size_t>(request.options.code)] +
                                  (' ' + model.sections.at(first.section).name),
                              last, taken);
         T_PHGT_D shown = type;
@@ -171,6 +192,40 @@ int CCodeHinges::Generate(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
     return 1;
 }
 
+int CCodeHinges::GenerateFromPush(T_CODE_REQUEST request, int loadCase, T_CODE_HINGES& out,
+                                  T_HINGE_REFUSAL& refusal)
+{
+    CEditScope edit(m_doc, "hinges of a code by a push"); // undone as one
+    T_CODE_HINGES made;
+    std::vector<T_CODE_ITERATION> iterations;
+    if (!Generate(request, made, refusal)) return 0;
+    while (iterations.size() < kMostPushes) {
+        std::vector<T_PUSH_RUN> runs;
+        std::string error;
+        if (!CPushRun(m_doc).Run(loadCase, {}, runs, error)) {
+            refusal = RefusalOf(0, error);
+            return 0;
+        }
+        std::vector<T_HINGE_MEMBER> members;
+        for (const T_CODE_ELEMENT& element : made.elements)
+            members.push_back(element.member);
+        auto now = PushedShears(runs, members);
+        iterations.push_back({LargestChange(ShearsOf(made), now), runs.front().outcome});
+        request.pushed = std::move(now);
+        if (iterations.size() > 1 && iterations.back().change.change < kSameShear) break;
+        if (!Generate(request, made, refusal)) return 0;
+    }
+    if (!(iterations.back().change.change < kSameShear))
+        made.warnings.push_back({"IDS_QM_GEN_WARN_NOT_SETTLED", {std::to_string(kMostPushes)}});
+    if (!edit.Commit()) {
+        refusal = RefusalOf(0, Say("IDS_QM_HINGE_NOT_STORED"));
+        return 0;
+    }
+    made.iterations = std::move(iterations);
+    out = std::move(made);
+    return 1;
+}
+
 std::string CCodeHinges::FaultOf(int hingeType)
 {
     const T_MODEL& model = m_doc.Data().Model();
@@ -184,13 +239,16 @@ std::string CCodeHinges::FaultOf(int hingeType)
         if (!ReadMember(model, id, m_axial, member, reason))
             return Say("IDS_QM_GEN_NOT_CHECKED",
                        Say("IDS_QM_HINGE_ELEMENT", std::to_string(id), reason));
+        member.pushed = type.generated->pushed;
         if (!SameInputs(type.generated->inputs, InputsOf(model, member)))
             return Say("IDS_QM_GEN_STALE", std::to_string(id));
     }
     if (member.element == 0) return {}; // no element has it
     T_CODE_HINGE today;
-    if (!MakeCodeHinge(model, member, static_cast<HINGE_CODE>(code - kHingeCodeNames.begin()),
-                       type.generated->secondary, today, reason))
+    const T_GENERATED& made = *type.generated;
+    const T_CODE_OPTIONS options{static_cast<HINGE_CODE>(code - kHingeCodeNames.begin()),
+                                 made.secondary, made.tie, made.axialRange};
+    if (!MakeCodeHinge(model, member, options, today, reason))
         return Say("IDS_QM_GEN_NOT_CHECKED", reason);
     return SameHinge(type, today.type) ? std::string() : Say("IDS_QM_GEN_EDITED");
 }

@@ -3,16 +3,18 @@
 #pragma once
 
 #include "qm_rps/generate/codehingetype.h"
+#include "qm_rps/generate/pushedshear.h"
 #include "qm_rps/hinge/hingefindings.h"
 #include "qm_rps/hinge/hingegenerator.h"
 
 #include <memory>
 
 struct T_CODE_REQUEST {
-    HINGE_CODE code = HINGE_CODE::Asce17;
-    bool secondary = false;
+    T_CODE_OPTIONS options;
     std::vector<int> elements; // empty: every beam element of the model, and trusses of steel
     bool keepGoing = false;    // leave out what can't have a hinge
+    /// By element, as T_GENERATED has it; others have V of the strengths at both ends.
+    std::map<int, std::vector<double>> pushed{};
 };
 
 /// The hinge of one element.
@@ -20,8 +22,14 @@ struct T_CODE_ELEMENT {
     T_HINGE_MEMBER member;
     std::shared_ptr<const T_CODE_HINGE> hinge; // its type has the name
 };
+/// One push of an iteration.
+struct T_CODE_ITERATION {
+    T_SHEAR_CHANGE change;
+    std::string outcome; // of the push
+};
 struct T_CODE_HINGES {
     std::vector<T_CODE_ELEMENT> elements;
+    std::vector<T_CODE_ITERATION> iterations;
     std::vector<T_HINGE_REFUSAL> skipped;
     std::vector<T_CODE_WARNING> warnings;
     std::size_t types = 0;
@@ -36,6 +44,15 @@ public:
     /// a type. 1 done; 0 with the first element that can't have a hinge, the document unchanged.
     [[nodiscard]] int Generate(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
                                T_HINGE_REFUSAL& refusal);
+
+    /// Generates, pushes a load case and generates again with the shear of the push (PushedShears)
+    /// until no V changes by kSameShear of itself, at most kMostPushes times; each push is told.
+    /// What the push could not settle is said as a warning. 1 done; 0 with the refusal, also where
+    /// the load case can't be pushed, the document unchanged.
+    [[nodiscard]] int GenerateFromPush(T_CODE_REQUEST request, int loadCase, T_CODE_HINGES& out,
+                                       T_HINGE_REFUSAL& refusal);
+    static constexpr double kSameShear = 0.01;
+    static constexpr int kMostPushes = 8;
 
     /// Of a generated type: section, material, member or loads are not those that it was made of;
     /// or they are, and its curves have been edited. Else nothing.

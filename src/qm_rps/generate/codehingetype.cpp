@@ -2,6 +2,7 @@
 
 #include "qm_base/say.h"
 #include "qm_rps/generate/axialcurve.h"
+#include "qm_rps/generate/masonryhinge.h"
 #include "qm_rps/generate/rchinge.h"
 #include "qm_rps/generate/steelhinge.h"
 #include "qm_rps/push/lawaxial.h"
@@ -94,8 +95,14 @@ std::optional<HINGE_LOCATION> LocationOf(const T_HINGE_MEMBER& member, HINGE_COM
 /// Sides of an end by what the member is made of.
 int EndHinge(const T_MEMBER_END& end, T_SIDES<T_CODE_SIDE>& out, std::string& reason)
 {
-    return end.material.type == MATL_CLASS::Steel ? SteelHinge(end, out, reason)
-                                                  : RcHinge(end, out, reason);
+    switch (end.material.type) {
+    case MATL_CLASS::Steel:
+        return SteelHinge(end, out, reason);
+    case MATL_CLASS::Masonry:
+        return MasonryHinge(end, out, reason);
+    default:
+        return RcHinge(end, out, reason); // refuses what is no concrete
+    }
 }
 
 /// A hinge of shear in the middle where a side asks for one: the weaker end's.
@@ -118,26 +125,70 @@ void AddShear(const T_CODE_COMPONENT& bending, T_CODE_HINGE& hinge)
     hinge.components.push_back(std::move(shear));
 }
 
-/// The backbones of both ends about the axes that have hinges.
-int Bend(const T_MODEL& model, const T_HINGE_MEMBER& member, HINGE_CODE code, bool secondary,
-         T_CODE_HINGE& hinge, std::string& reason)
+/// What the hinges of a member are made for.
+struct T_TASK {
+    const T_MODEL& model;
+    const T_HINGE_MEMBER& member;
+    const T_CODE_OPTIONS& options;
+};
+
+int BothEnds(const T_TASK& task, HINGE_COMPONENT component, const T_ENDS<double>& axial,
+             T_ENDS<T_SIDES<T_CODE_SIDE>>& out, std::string& reason)
 {
-    for (const HINGE_COMPONENT component : member.bending) {
-        const auto location = LocationOf(member, component);
+    const auto end = [&](bool atI) {
+        return EndOf(task.model, task.member, task.options, component, atI,
+                     atI ? axial.I : axial.J);
+    };
+    if (!EndHinge(end(true), out.I, reason)) return 0;
+    const bool same = !task.member.HasAxial() || axial.I == axial.J;
+    if (same && task.member.pushed.empty()) {
+        out.J = out.I;
+        return 1;
+    }
+    return EndHinge(end(false), out.J, reason);
+}
+
+/// Even forces from the lower to the upper end, and 0.
+std::vector<double> ForcesOf(const std::vector<double>& range)
+{
+    constexpr int kCurves = 6;
+    std::vector<double> forces{0.0};
+    for (int i = 0; i < kCurves; ++i) {
+        const double t = static_cast<double>(i) / (kCurves - 1);
+        const double force = range[0] + t * (range[1] - range[0]);
+        if (std::fabs(force) > 1e-6 * (range[1] - range[0])) forces.push_back(force);
+    }
+    std::ranges::sort(forces);
+    return forces;
+}
+
+/// Curves of columns by axial force.
+int AddByAxial(const T_TASK& task, T_CODE_COMPONENT& bending, std::string& reason)
+{
+    if (task.options.axialRange.empty() || !task.member.HasAxial()) return 1;
+    for (const double force : ForcesOf(task.options.axialRange)) {
+        T_CODE_AXIAL at;
+        at.axial = force;
+        std::string why;
+        if (!BothEnds(task, bending.component, {force, force}, at.ends, why))
+            return Refuse(reason, Say("IDS_QM_GEN_AT_AXIAL", CodeNumber(force / 1000.0), why));
+        bending.byAxial.push_back(std::move(at));
+    }
+    return 1;
+}
+
+/// The backbones of both ends about the axes that have hinges.
+int Bend(const T_TASK& task, T_CODE_HINGE& hinge, std::string& reason)
+{
+    for (const HINGE_COMPONENT component : task.member.bending) {
+        const auto location = LocationOf(task.member, component);
         if (!location) continue;
         T_CODE_COMPONENT bending;
         bending.component = component;
         bending.location = *location;
-        const bool same = !member.HasAxial() || member.axial.I == member.axial.J;
-        for (const bool atI : {true, false}) {
-            if (!atI && same) {
-                bending.ends.J = bending.ends.I;
-                continue;
-            }
-            const T_MEMBER_END end = EndOf(model, member, code, secondary, component,
-                                           atI ? member.axial.I : member.axial.J);
-            if (!EndHinge(end, atI ? bending.ends.I : bending.ends.J, reason)) return 0;
-        }
+        if (!BothEnds(task, component, task.member.axial, bending.ends, reason) ||
+            !AddByAxial(task, bending, reason))
+            return 0;
         WarnEarly(bending.ends.I, hinge);
         WarnEarly(bending.ends.J, hinge);
         hinge.components.push_back(bending);
@@ -147,18 +198,33 @@ int Bend(const T_MODEL& model, const T_HINGE_MEMBER& member, HINGE_CODE code, bo
 }
 
 /// The hinge of axial force of a brace.
-int Brace(const T_MODEL& model, const T_HINGE_MEMBER& member, HINGE_CODE code, bool secondary,
-          T_CODE_HINGE& hinge, std::string& reason)
+int Brace(const T_TASK& task, T_CODE_HINGE& hinge, std::string& reason)
 {
     T_CODE_COMPONENT axial;
     axial.component = HINGE_COMPONENT::Fx;
     axial.location = HINGE_LOCATION::Center;
     const T_MEMBER_END end =
-        EndOf(model, member, code, secondary, HINGE_COMPONENT::My, member.axial.I);
+        EndOf(task.model, task.member, task.options, HINGE_COMPONENT::My, true, 0.0);
     if (!SteelBrace(end, axial.ends.I, reason)) return 0;
     axial.ends.J = axial.ends.I;
     hinge.components.push_back(std::move(axial));
     return 1;
+}
+
+/// The curves of an end of a FEMA component by axial force.
+void PutByAxial(const T_CODE_COMPONENT& b, bool atI, T_SKEL_CURVE& curve)
+{
+    auto* fema = std::get_if<T_SKEL_FEMA>(&curve);
+    if (!fema || b.byAxial.empty()) return;
+    fema->multiCurve = true;
+    for (const T_CODE_AXIAL& at : b.byAxial) {
+        const auto& sides = atI ? at.ends.I : at.ends.J;
+        T_SKEL_AXIAL row;
+        row.axial = at.axial;
+        row.sides.pos = CurveSide(SideOf(sides, b.component, true), true, false);
+        row.sides.neg = CurveSide(SideOf(sides, b.component, false), false, false);
+        fema->curves.push_back(row);
+    }
 }
 
 void Fill(const T_HINGE_MEMBER& member, bool chord, T_CODE_HINGE& hinge)
@@ -172,6 +238,8 @@ void Fill(const T_HINGE_MEMBER& member, bool chord, T_CODE_HINGE& hinge)
         c.location = b.location;
         c.curves.I = CurveOf(b.ends.I, b.component, follows, chord);
         c.curves.J = CurveOf(b.ends.J, b.component, follows, chord);
+        PutByAxial(b, true, c.curves.I);
+        PutByAxial(b, false, c.curves.J);
         c.sameEnds = c.curves.I == c.curves.J;
         if (!chord || !std::ranges::count(member.bending, b.component)) continue;
         T_ENDS<double>& length =
@@ -181,13 +249,14 @@ void Fill(const T_HINGE_MEMBER& member, bool chord, T_CODE_HINGE& hinge)
 }
 
 /// The strengths of bending by axial force.
-void PutAxialCurve(const T_MODEL& model, const T_HINGE_MEMBER& member, HINGE_CODE code,
-                   bool secondary, T_CODE_HINGE& hinge)
+void PutAxialCurve(const T_TASK& task, T_CODE_HINGE& hinge)
 {
     std::vector<T_MEMBER_END> ends;
+    const T_HINGE_MEMBER& member = task.member;
     for (const T_CODE_COMPONENT& b : hinge.components)
         if (std::ranges::count(member.bending, b.component))
-            ends.push_back(EndOf(model, member, code, secondary, b.component, member.axial.I));
+            ends.push_back(
+                EndOf(task.model, member, task.options, b.component, true, member.axial.I));
     T_PHGT_D& type = hinge.type;
     type.pmm = type.material == MATL_CLASS::Steel ? SteelAxialCurve(ends, member.axial)
                                                   : AxialCurve(ends, member.axial);
@@ -218,13 +287,21 @@ private:
     template <class CURVE>
     void Add([[maybe_unused]] CURVE& curve)
     {
-        if constexpr (!std::is_same_v<CURVE, T_SKEL_MULTI>)
-            for (T_SKEL_SIDE* s : {&curve.sides.pos, &curve.sides.neg}) {
-                numbers.insert(numbers.end(), {&s->yield, &s->yieldDeform});
-                numbers.insert(numbers.end(), {&s->IO, &s->LS, &s->CP});
-                for (T_SKEL_POINT* p : {&s->B, &s->C, &s->D, &s->E})
-                    numbers.insert(numbers.end(), {&p->deform, &p->strength});
+        if constexpr (!std::is_same_v<CURVE, T_SKEL_MULTI>) AddSides(curve.sides);
+        if constexpr (std::is_same_v<CURVE, T_SKEL_FEMA>)
+            for (T_SKEL_AXIAL& at : curve.curves) {
+                numbers.push_back(&at.axial);
+                AddSides(at.sides);
             }
+    }
+    void AddSides(T_SIDES<T_SKEL_SIDE>& sides)
+    {
+        for (T_SKEL_SIDE* s : {&sides.pos, &sides.neg}) {
+            numbers.insert(numbers.end(), {&s->yield, &s->yieldDeform});
+            numbers.insert(numbers.end(), {&s->IO, &s->LS, &s->CP});
+            for (T_SKEL_POINT* p : {&s->B, &s->C, &s->D, &s->E})
+                numbers.insert(numbers.end(), {&p->deform, &p->strength});
+        }
     }
     void Add(T_PMM_CURVES& curves)
     {
@@ -236,24 +313,30 @@ private:
 
 } // namespace
 
-int MakeCodeHinge(const T_MODEL& model, const T_HINGE_MEMBER& member, HINGE_CODE code,
-                  bool secondary, T_CODE_HINGE& out, std::string& reason)
+int MakeCodeHinge(const T_MODEL& model, const T_HINGE_MEMBER& member, const T_CODE_OPTIONS& options,
+                  T_CODE_HINGE& out, std::string& reason)
 {
     T_CODE_HINGE hinge;
+    const T_TASK task{model, member, options};
     T_PHGT_D& type = hinge.type;
     type.material = model.materials.at(member.material).type;
     if (member.kind == MEMBER_KIND::Brace) {
-        if (!Brace(model, member, code, secondary, hinge, reason)) return 0;
+        if (!Brace(task, hinge, reason)) return 0;
         if (model.elements.at(member.element).kind == ELEM_KIND::Truss)
             type.element = HINGE_ELEMENT::Truss;
     } else {
-        if (!Bend(model, member, code, secondary, hinge, reason)) return 0;
-        if (member.HasAxial()) PutAxialCurve(model, member, code, secondary, hinge);
+        if (!Bend(task, hinge, reason)) return 0;
+        if (member.HasAxial() && type.material != MATL_CLASS::Masonry && options.axialRange.empty())
+            PutAxialCurve(task, hinge);
     }
-    Fill(member, IsChordCode(code), hinge);
-    type.generated =
-        T_GENERATED{kHingeCodeNames[static_cast<std::size_t>(code)], secondary,
-                    member.HasAxial() ? member.axial : T_ENDS<double>{}, InputsOf(model, member)};
+    Fill(member, IsChordCode(options.code), hinge);
+    type.generated = T_GENERATED{kHingeCodeNames[static_cast<std::size_t>(options.code)],
+                                 options.secondary,
+                                 member.HasAxial() ? member.axial : T_ENDS<double>{},
+                                 InputsOf(model, member),
+                                 member.pushed,
+                                 options.axialRange,
+                                 options.tie};
     out = std::move(hinge);
     return 1;
 }

@@ -4,6 +4,7 @@
 #include "qm_rps/codes/codebackbone.h"
 
 #include <array>
+#include <vector>
 
 enum class HINGE_CODE { Asce17, Asce13, Fema356, En1998, Circolare2019 };
 inline constexpr std::array<const char*, 5> kHingeCodeNames{"ASCE41-17", "ASCE41-13", "FEMA356",
@@ -13,6 +14,14 @@ inline bool IsChordCode(HINGE_CODE code)
 {
     return code >= HINGE_CODE::En1998;
 }
+
+/// What is asked for, beside the members. SI.
+struct T_CODE_OPTIONS {
+    HINGE_CODE code = HINGE_CODE::Asce17;
+    bool secondary = false;           // members
+    double tie = 0.0;                 // strength of what ties spandrels
+    std::vector<double> axialRange{}; // from, to: FEMA curves at axial forces within; empty: none
+};
 
 /// What a member is to the codes. Steep (above 45 degrees): column, wall, pier; else beam,
 /// spandrel.
@@ -50,6 +59,12 @@ struct T_MEMBER_END {
 
     double ShearSpan() const { return pushed ? pushed->shearSpan : clear / 2.0; }
     bool HasAxial() const { return IsUpright(kind); }
+    /// Displacement of one end across the other under a shear force, bent by equal end moments.
+    double Sway(double shear) const
+    {
+        const double bending = shear * clear * clear * clear / (12.0 * EI);
+        return bending + (GA > 0.0 ? shear * clear / GA : 0.0);
+    }
 };
 
 struct T_CODE_SIDE {

@@ -121,6 +121,9 @@ void AppendMaterial(const T_MATL_D& m, std::vector<double>& to)
     Append(to,
            {m.confidence.value_or(0.0), m.knowledge ? 1.0 + static_cast<int>(*m.knowledge) : 0.0});
     if (m.type == MATL_CLASS::Steel) Append(to, {m.Fy});
+    if (!m.masonry) return;
+    Append(to, {m.masonry->tau0, m.masonry->fv0, m.masonry->fb, m.masonry->interlocking});
+    Append(to, {1.0 * static_cast<int>(m.masonry->bond), m.masonry->hollowBlocks ? 1.0 : 0.0});
 }
 
 void AppendSection(const T_SECT_D& s, std::vector<double>& to)
@@ -177,12 +180,13 @@ int ReadMember(const T_MODEL& model, int element, const CInitialAxial& axial, T_
     return 1;
 }
 
-T_MEMBER_END EndOf(const T_MODEL& model, const T_HINGE_MEMBER& member, HINGE_CODE code,
-                   bool secondary, HINGE_COMPONENT component, double axial)
+T_MEMBER_END EndOf(const T_MODEL& model, const T_HINGE_MEMBER& member,
+                   const T_CODE_OPTIONS& options, HINGE_COMPONENT component, bool atI, double axial)
 {
     T_MEMBER_END end;
-    end.code = code;
-    end.secondary = secondary;
+    end.code = options.code;
+    end.secondary = options.secondary;
+    end.tie = options.tie;
     end.kind = member.kind;
     end.aboutY = component == kMy;
     end.section = model.sections.at(member.section);
@@ -197,6 +201,10 @@ T_MEMBER_END EndOf(const T_MODEL& model, const T_HINGE_MEMBER& member, HINGE_COD
     end.GA =
         m.G.value_or(m.E / (2.0 * (1.0 + m.nu))) * (end.aboutY ? end.section.Asz : end.section.Asy);
     end.length = member.length;
+    const auto axis = std::ranges::find(member.bending, component) - member.bending.begin();
+    const std::size_t place = 4 * static_cast<std::size_t>(axis) + (atI ? 0 : 2);
+    if (place + 1 < member.pushed.size() && member.pushed[place] > 0.0)
+        end.pushed = T_PUSHED_SHEAR{member.pushed[place], member.pushed[place + 1]};
     return end;
 }
 
@@ -217,6 +225,7 @@ std::vector<double> InputsOf(const T_MODEL& model, const T_HINGE_MEMBER& member)
     }
     AppendMaterial(material, inputs);
     AppendSection(section, inputs);
+    inputs.insert(inputs.end(), member.pushed.begin(), member.pushed.end());
     return inputs;
 }
 

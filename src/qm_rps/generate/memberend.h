@@ -14,6 +14,7 @@ struct T_HINGE_MEMBER {
     T_ENDS<double> axial{};               // compression positive
     std::vector<HINGE_COMPONENT> bending; // about which axes
     T_ENDS<T_DIRS6> release{};
+    std::vector<double> pushed{}; // as T_GENERATED has it
 
     bool HasAxial() const { return IsUpright(kind); }
 };
@@ -28,9 +29,10 @@ struct T_HINGE_MEMBER {
 [[nodiscard]] int ReadMember(const T_MODEL& model, int element, const CInitialAxial& axial,
                              T_HINGE_MEMBER& out, std::string& reason);
 
-/// The end of a member about an axis as the codes' formulas take it.
-T_MEMBER_END EndOf(const T_MODEL& model, const T_HINGE_MEMBER& member, HINGE_CODE code,
-                   bool secondary, HINGE_COMPONENT component, double axial);
+/// An end of a member about an axis as the codes' formulas take it, under an axial force.
+T_MEMBER_END EndOf(const T_MODEL& model, const T_HINGE_MEMBER& member,
+                   const T_CODE_OPTIONS& options, HINGE_COMPONENT component, bool atI,
+                   double axial);
 
 /// All that a hinge type hangs on, in a fixed order.
 std::vector<double> InputsOf(const T_MODEL& model, const T_HINGE_MEMBER& member);

@@ -92,13 +92,6 @@ std::optional<T_CODE_PLASTIC> AsceColumnEnd(const T_RC_BASIS& in, T_CODE_SIDE& s
     return AsceColumn(column, EditionOf(in.end), sheet);
 }
 
-/// Deformation of one end across the other at a shear force, bent by two equal end moments.
-double SwayOf(const T_MEMBER_END& end, double shear)
-{
-    const double bending = shear * end.clear * end.clear * end.clear / (12.0 * end.EI);
-    return bending + (end.GA > 0.0 ? shear * end.clear / end.GA : 0.0);
-}
-
 /// The table's plastic rotations as displacements of one end across the other.
 std::optional<T_CODE_BACKBONE> ShearBackbone(const T_RC_BASIS& in, const T_CODE_PLASTIC& plastic,
                                              const T_CODE_SIDE& side, CCodeSheet& sheet)
@@ -108,7 +101,7 @@ std::optional<T_CODE_BACKBONE> ShearBackbone(const T_RC_BASIS& in, const T_CODE_
     T_CODE_PLASTIC moved = Scaled(plastic, length);
     T_BACKBONE_IN curve;
     curve.yield = side.shearStrength;
-    curve.yieldDeform = sheet.Put("Delta_y", SwayOf(in.end, side.shearStrength), kDimLength, "",
+    curve.yieldDeform = sheet.Put("Delta_y", in.end.Sway(side.shearStrength), kDimLength, "",
                                   "Vn L^3/(12 EI) + Vn L/(G Av) of the model", K);
     curve.dim = kDimLength;
     return BackboneOfPlastic(moved, curve, sheet);

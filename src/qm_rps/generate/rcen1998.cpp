@@ -16,10 +16,17 @@ constexpr auto K = CODE_MARK::Computed;
 std::vector<double> Gaps(const T_RC_BENDING& s)
 {
     std::vector<double> gaps;
-    if (s.round) return gaps; // (A.2) is then that of a circle within hoops, (1 - sh/2 D0)^2
     for (const auto& [core, legs] : {std::pair(s.coreB, s.legs), std::pair(s.coreH, s.across)})
         gaps.insert(gaps.end(), static_cast<std::size_t>(2 * (legs - 1)), core / (legs - 1));
     return gaps;
+}
+
+/// A circle within hoops.
+std::optional<double> RoundEffectiveness(const T_RC_BENDING& s, bool hooked, CCodeSheet& sheet)
+{
+    const double arch = std::max(0.0, 1.0 - s.spacing / (2.0 * s.coreB));
+    return sheet.Put("alpha", hooked ? arch * arch : 0.0, "EN 1998-1 5.4.3.2.2(8)",
+                     "(1 - s/2 D0)^2; hooks not 135 degrees: 0", CODE_MARK::Recalled);
 }
 
 std::optional<T_EN_MEMBER> EnMember(const T_RC_BASIS& in, CCodeSheet& sheet)
@@ -28,7 +35,8 @@ std::optional<T_EN_MEMBER> EnMember(const T_RC_BASIS& in, CCodeSheet& sheet)
     const T_SECT_DETAIL& detail = *in.end.section.detailing;
     const bool hooked = detail.hooks == STIRRUP_HOOKS::Hooks135;
     const std::optional<double> alpha =
-        HoopEffectiveness({s.coreB, s.coreH, s.spacing, Gaps(s), hooked}, sheet);
+        s.round ? RoundEffectiveness(s, hooked, sheet)
+                : HoopEffectiveness({s.coreB, s.coreH, s.spacing, Gaps(s), hooked}, sheet);
     if (!alpha) return {};
     T_EN_MEMBER m;
     m.b = s.b;
