@@ -1,0 +1,234 @@
+#include "qm_rps/generate/jointcheck.h"
+
+#include "qm_base/say.h"
+#include "qm_rps/codes/en1998shear.h"
+#include "qm_rps/generate/rchinge.h"
+#include "qm_rps/push/pushstoreys.h"
+
+#include <algorithm>
+#include <cmath>
+#include <numeric>
+
+namespace {
+
+using T_VECTOR = std::array<double, 3>;
+constexpr auto K = CODE_MARK::Computed;
+constexpr double kAlong = 0.7071; // cosine of 45 degrees
+
+int Fail(std::string& reason, std::string words)
+{
+    reason = std::move(words);
+    return 0;
+}
+
+/// From the node to the other end; nothing: a model without that node.
+std::optional<T_VECTOR> WayFrom(const T_MODEL& model, const T_ELEM_D& e, int node)
+{
+    const auto from = model.nodes.find(node);
+    const auto to = model.nodes.find(e.nodeI == node ? e.nodeJ : e.nodeI);
+    if (from == model.nodes.end() || to == model.nodes.end()) return {};
+    T_VECTOR way{};
+    for (std::size_t i = 0; i < way.size(); ++i)
+        way[i] = to->second.xyz[i] - from->second.xyz[i];
+    const double length = std::sqrt(std::inner_product(way.begin(), way.end(), way.begin(), 0.0));
+    if (!(length > 0.0)) return {};
+    for (double& w : way)
+        w /= length;
+    return way;
+}
+
+/// Members of concrete that meet at a node.
+struct T_MEETING {
+    int above = 0, below = 0;
+    std::vector<int> ahead, behind, across;
+};
+T_MEETING MeetingAt(const T_MODEL& model, int node, std::size_t along)
+{
+    T_MEETING m;
+    const std::size_t up = VerticalAxis(model);
+    for (const auto& [id, e] : model.elements) {
+        if (e.kind != ELEM_KIND::Beam || (e.nodeI != node && e.nodeJ != node)) continue;
+        const auto way = WayFrom(model, e, node);
+        if (!way) continue;
+        if ((*way)[up] > kAlong)
+            m.above = id;
+        else if ((*way)[up] < -kAlong)
+            m.below = id;
+        else if (std::fabs((*way)[along]) > kAlong)
+            ((*way)[along] > 0.0 ? m.ahead : m.behind).push_back(id);
+        else
+            m.across.push_back(id);
+    }
+    return m;
+}
+
+/// Section and material of an element, where both are there and of concrete.
+struct T_PART {
+    const T_SECT_D* section = nullptr;
+    const T_MATL_D* material = nullptr;
+};
+T_PART PartOf(const T_MODEL& model, int element)
+{
+    const T_ELEM_D& e = model.elements.at(element);
+    const auto section = model.sections.find(e.section);
+    const auto material = model.materials.find(e.material);
+    const bool fits = section != model.sections.end() && material != model.materials.end() &&
+                      material->second.type == MATL_CLASS::Concrete &&
+                      section->second.shape == SECT_SHAPE::Rectangle;
+    return fits ? T_PART{&section->second, &material->second} : T_PART{};
+}
+
+JOINT_KIND KindOf(const T_MEETING& m)
+{
+    const bool interior = !m.ahead.empty() && !m.behind.empty();
+    const bool transverse = m.across.size() > 1;
+    if (interior) return transverse ? JOINT_KIND::InteriorWithBeams : JOINT_KIND::Interior;
+    if (m.above == 0) return JOINT_KIND::Knee;
+    return transverse ? JOINT_KIND::ExteriorWithBeams : JOINT_KIND::Exterior;
+}
+
+/// Upright local z is the element's own vector, else global X.
+double DepthAlong(const T_ELEM_D& e, const T_SECT_D& s, std::size_t along)
+{
+    const bool own = e.zAxis != T_VECTOR{};
+    const double z = own ? e.zAxis[along] : (along == 0 ? 1.0 : 0.0);
+    const double size =
+        own ? std::sqrt(std::inner_product(e.zAxis.begin(), e.zAxis.end(), e.zAxis.begin(), 0.0))
+            : 1.0;
+    return std::fabs(z) > kAlong * size ? s.size[0] : s.size[1];
+}
+
+/// Width that carries shear: ACI 318 15.4.2.4 or EN 1998-1 5.5.3.3(2).
+double WidthOf(HINGE_CODE code, double column, double beam, double hc)
+{
+    if (!IsChordCode(code)) return std::min(column, beam + hc);
+    return column > beam ? std::min(column, beam + 0.5 * hc) : std::min(beam, column + 0.5 * hc);
+}
+
+/// EN 1998-1 5.5.3.3(2): diagonal compression, without partial factors.
+std::optional<double> EnJointStrength(const T_JOINT& j, double axial, CCodeSheet& sheet)
+{
+    constexpr const char* kClause = "EN 1998-1 5.5.3.3";
+    constexpr auto R = CODE_MARK::Recalled;
+    const double eta = sheet.Put("eta", 0.6 * (1.0 - j.fc / kPascalsPerMpa / 250.0), kClause,
+                                 "0.6 (1 - fc/250)", R);
+    const double nu =
+        sheet.Put("nu_d", std::max(0.0, axial) / (j.columnArea * j.fc), kClause, "N/(Ac fc)", R);
+    if (!sheet.Positive({{"eta", eta}}) || !sheet.Within("axial", nu, 0.0, eta)) return {};
+    const bool interior = j.kind == JOINT_KIND::Interior || j.kind == JOINT_KIND::InteriorWithBeams;
+    const double share = sheet.Put("share", interior ? 1.0 : 0.8, kClause, "exterior 0.8", R);
+    return sheet.Put("Vj,R", share * eta * j.fc * std::sqrt(1.0 - nu / eta) * j.width * j.hc,
+                     kDimForce, kClause, "eta fc sqrt(1 - nu_d/eta) bj hc", R);
+}
+
+bool Asce(const T_JOINT& j, const T_JOINT_DEMAND& d, T_JOINT_CHECK& out, CCodeSheet& sheet)
+{
+    T_ASCE_JOINT in;
+    in.kind = j.kind;
+    in.hc = j.hc;
+    in.fc = j.lower;
+    in.Ag = j.columnArea;
+    in.area = j.width * j.hc;
+    in.axial = d.axial;
+    in.shear = out.shear;
+    const std::optional<double> strength = AsceJointStrength(in, sheet);
+    if (!strength) return false;
+    out.capacity = *strength;
+    in.fc = j.fc;
+    CCodeSheet expected; // the table's own strength is the expected one
+    out.rotations = AsceJoint(in, expected);
+    return true;
+}
+
+bool Circolare(const T_JOINT& j, const T_JOINT_DEMAND& d, T_JOINT_CHECK& out, CCodeSheet& sheet)
+{
+    const auto s = CircolareJoint(d.axial, out.shear, j.width * j.hc, j.fc, sheet);
+    if (!s) return false;
+    const bool tension = s->tension / s->tensionLimit > s->compression / s->compressionLimit;
+    out.demand = tension ? s->tension : s->compression;
+    out.capacity = tension ? s->tensionLimit : s->compressionLimit;
+    out.dim = kDimStress;
+    return true;
+}
+
+} // namespace
+
+int ReadJoint(const T_MODEL& model, int node, std::size_t along, HINGE_CODE code, T_JOINT& out,
+              std::string& reason)
+{
+    const T_MEETING m = MeetingAt(model, node, along);
+    const int column = m.below != 0 ? m.below : m.above;
+    std::vector<int> beams = m.ahead;
+    beams.insert(beams.end(), m.behind.begin(), m.behind.end());
+    if (column == 0 || beams.empty() || m.ahead.size() > 1 || m.behind.size() > 1)
+        return Fail(reason, Say("IDS_QM_GEN_NO_JOINT"));
+    const T_PART post = PartOf(model, column);
+    if (!post.section) return Fail(reason, Say("IDS_QM_GEN_JOINT_CONCRETE"));
+    CCodeSheet sheet;
+    const auto material = RcMaterial(*post.material, code, sheet);
+    if (!material) return Fail(reason, ReasonOf(sheet));
+    T_JOINT j;
+    j.code = code;
+    j.node = node;
+    j.column = column;
+    j.beams = beams;
+    j.kind = KindOf(m);
+    j.fc = material->fc;
+    j.lower = post.material->fck > 0.0 ? post.material->fck : material->fc;
+    j.columnArea = post.section->size[0] * post.section->size[1];
+    j.hc = DepthAlong(model.elements.at(column), *post.section, along);
+    double widest = 0.0;
+    for (const int beam : beams) {
+        const T_PART part = PartOf(model, beam);
+        if (!part.section) return Fail(reason, Say("IDS_QM_GEN_JOINT_CONCRETE"));
+        for (const bool positive : {true, false}) {
+            CCodeSheet side;
+            const auto bending = RcBending(*part.section, true, positive, side);
+            if (!bending) return Fail(reason, ReasonOf(side));
+            const double lever = 0.9 * bending->d;
+            j.lever = j.lever > 0.0 ? std::min(j.lever, lever) : lever;
+        }
+        widest = std::max(widest, part.section->size[1]);
+    }
+    j.width = WidthOf(code, j.columnArea / j.hc, widest, j.hc);
+    j.trace = sheet.Trace();
+    out = std::move(j);
+    return 1;
+}
+
+int CheckJoint(const T_JOINT& joint, const T_JOINT_DEMAND& demand, T_JOINT_CHECK& out,
+               std::string& reason)
+{
+    CCodeSheet sheet;
+    sheet.Positive({{"lever", joint.lever}, {"hc", joint.hc}, {"width", joint.width}});
+    sheet.Positive({{"fc", joint.fc}, {"columnArea", joint.columnArea}});
+    sheet.Finite({{"beam moments", demand.beamMoments}, {"column shear", demand.columnShear}});
+    if (!sheet.Finite({{"axial", demand.axial}})) return Fail(reason, ReasonOf(sheet));
+    T_JOINT_CHECK check;
+    sheet.Put("z", joint.lever, kDimLength, "", "0.9 d of the beams", K);
+    sheet.Put("bj hc", joint.width * joint.hc, T_DIM{0, 2}, "", "", K);
+    sheet.Put("N", demand.axial, kDimForce, "", "of the column above", K);
+    check.shear =
+        sheet.Put("Vj", std::fabs(demand.beamMoments) / joint.lever - std::fabs(demand.columnShear),
+                  kDimForce, "", "sum M/z - V of the column", K);
+    check.shear = std::max(0.0, check.shear);
+    check.demand = check.shear;
+    check.dim = kDimForce;
+    bool done = true;
+    if (joint.code == HINGE_CODE::Circolare2019) {
+        done = Circolare(joint, demand, check, sheet);
+    } else if (joint.code == HINGE_CODE::En1998) {
+        const auto strength = EnJointStrength(joint, demand.axial, sheet);
+        done = strength.has_value();
+        check.capacity = strength.value_or(0.0);
+    } else {
+        done = Asce(joint, demand, check, sheet);
+    }
+    if (!done || !sheet.Sound()) return Fail(reason, ReasonOf(sheet));
+    sheet.Warn("IDS_QM_GEN_WARN_JOINT_HOOPS", {});
+    check.trace = joint.trace;
+    check.trace.insert(check.trace.end(), sheet.Trace().begin(), sheet.Trace().end());
+    check.warnings = sheet.Warnings();
+    out = std::move(check);
+    return 1;
+}

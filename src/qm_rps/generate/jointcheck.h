@@ -1,0 +1,45 @@
+// Shear of beam-column joints of concrete: what they are in a model, and their check by a code. SI.
+#pragma once
+
+#include "qm_db/dbdoc.h"
+#include "qm_rps/codes/asce41concrete.h"
+#include "qm_rps/generate/codeside.h"
+
+/// A joint in the plane of the vertical and a horizontal axis.
+struct T_JOINT {
+    HINGE_CODE code = HINGE_CODE::Asce17;
+    int node = 0, column = 0; // element
+    std::vector<int> beams;   // elements in the plane, one or two
+    JOINT_KIND kind = JOINT_KIND::Interior;
+    double hc = 0.0, width = 0.0; // depth of the column along the beams; of the joint across
+    double columnArea = 0.0;      // Ag
+    double lever = 0.0;           // of the beams' bars, 0.9 d of the shallower one
+    double fc = 0.0;              // assessed: expected (ASCE 41), mean over the confidence factor
+    double lower = 0.0;           // lower bound (ASCE 41)
+    std::vector<T_CODE_TRACE> trace; // of the strengths
+};
+/// The joint at a node along a global horizontal axis (0: X, 1: Y, 2: Z). Rectangular columns and
+/// beams of concrete with bars. 1 done; 0 with the reason in words, `out` unchanged.
+[[nodiscard]] int ReadJoint(const T_MODEL& model, int node, std::size_t along, HINGE_CODE code,
+                            T_JOINT& out, std::string& reason);
+
+struct T_JOINT_DEMAND {
+    double beamMoments = 0.0; // sum of the beams' end moments that turn the joint the same way
+    double columnShear = 0.0; // of the column above, against the force of the bars
+    double axial = 0.0;       // of the column above, compression positive
+};
+struct T_JOINT_CHECK {
+    double shear = 0.0;                        // Vj = beam moments / lever - column shear
+    double demand = 0.0, capacity = 0.0;       // forces; Circolare: the governing stress, its limit
+    T_DIM dim{};                               // of these
+    std::optional<T_CODE_PLASTIC> rotations{}; // ASCE 41 Table 10-11: shear angles
+    std::vector<T_CODE_TRACE> trace;
+    std::vector<T_CODE_WARNING> warnings;
+
+    double Ratio() const { return demand / capacity; }
+};
+/// ASCE 41-17 Table 10-12 with the lower-bound strength (41-13, FEMA 356: the same rows), EN 1998-1
+/// 5.5.3.3 without hoops, Circolare 2019 [C8.7.2.11], [C8.7.2.12]. No hoops are counted in the
+/// joint. 1 done; 0 with the reason in words, `out` unchanged.
+[[nodiscard]] int CheckJoint(const T_JOINT& joint, const T_JOINT_DEMAND& demand, T_JOINT_CHECK& out,
+                             std::string& reason);
