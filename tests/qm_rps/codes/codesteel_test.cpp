@@ -3,7 +3,9 @@
 #include "qm_rps/codes/asce41connection.h"
 #include "qm_rps/codes/asce41steel.h"
 #include "qm_rps/codes/codebackbone.h"
+#include "qm_rps/codes/en1993class.h"
 #include "qm_rps/codes/en1998steel.h"
+#include "qm_rps/codes/steelbuckling.h"
 #include "qm_rps/codes/steelinteraction.h"
 
 #include "codetesting.h"
@@ -287,4 +289,74 @@ TEST(SteelInteraction, HandValues)
     ExpectRel(0.6e6 * 0.610062816, cv(100.0), 1e-8, "slender web");
     // p = 0.5, my = 0.4, mz = 0.3: 0.25 + 0.09 + 0.0256 + 0.07875 + 0.0075 + 0.005832.
     ExpectRel(0.457682, *WideFlangeSurface(0.5, 0.4, 0.3, sheet), 1e-9, "surface");
+}
+
+TEST(SteelClass, WorstPartOfTable52)
+{
+    // eps = 1 at 235 MPa. I 300 x 100: flange (100 - tw)/2/tf, web (300 - 2 tf)/tw.
+    constexpr double fy = 235e6;
+    const auto shape = [](STEEL_SHAPE kind, double b, double tf, double tw) {
+        T_STEEL_SHAPE s;
+        s.shape = kind;
+        s.h = 0.3, s.b = b, s.tf = tf, s.tw = tw;
+        return s;
+    };
+    using enum STEEL_SHAPE;
+    const struct {
+        const char* label;
+        T_STEEL_SHAPE shape;
+        bool aboutY;
+        double axial;
+        int bent, pressed;
+    } cases[] = {
+        {"web 28: pressed 28 <= 33", shape(WeldedI, 0.1, 0.01, 0.01), true, 0.0, 1, 1},
+        {"flange 9.5 of 9 and 10", shape(WeldedI, 0.2, 0.01, 0.01), true, 0.0, 2, 2},
+        {"flange 14.5 beyond 14", shape(WeldedI, 0.3, 0.01, 0.01), true, 0.0, 4, 4},
+        {"web 70 of 72; pressed beyond 42", shape(WeldedI, 0.1, 0.01, 0.004), true, 0.0, 1, 4},
+        // N over the whole web: 396/(13 - 1) = 33.
+        {"web 28, N", shape(WeldedI, 0.1, 0.01, 0.01), true, 1e6, 1, 1},
+        {"web 35, N: 33 and 38", shape(WeldedI, 0.1, 0.01, 0.008), true, 1e6, 2, 2},
+        {"web 70 in the middle, about z", shape(WeldedI, 0.1, 0.01, 0.004), false, 0.0, 1, 4},
+        {"the same with N", shape(WeldedI, 0.1, 0.01, 0.004), false, 1e3, 4, 4},
+        {"box: flange (350 - 20)/10 = 33", shape(RectangularTube, 0.35, 0.01, 0.01), true, 0.0, 1,
+         1},
+        {"box about z: webs are the flanges", shape(RectangularTube, 0.75, 0.01, 0.01), false, 0.0,
+         2, 4},
+        {"tube 300/6 = 50", shape(CircularTube, 0.3, 0.006, 0.006), true, 0.0, 1, 1},
+        {"tube 300/4 = 75: 70 and 90", shape(CircularTube, 0.3, 0.004, 0.004), true, 0.0, 3, 3},
+    };
+    for (const auto& c : cases) {
+        CCodeSheet sheet;
+        EXPECT_EQ(c.bent, En1993Class(c.shape, c.aboutY, c.axial, fy, sheet)) << c.label;
+        EXPECT_EQ(c.pressed, En1993ClassCompressed(c.shape, fy, sheet)) << c.label;
+    }
+}
+
+TEST(SteelBuckling, CurvesOfBothCodes)
+{
+    // K L / i = pi sqrt(E / fy) times the slenderness; area 1.
+    const auto member = [](double slenderness) {
+        T_BUCKLING b;
+        b.area = 1.0, b.radius = 1.0, b.E = 210e9, b.fy = 235e6;
+        b.length = slenderness * std::acos(-1.0) * std::sqrt(b.E / b.fy);
+        return b;
+    };
+    CCodeSheet sheet;
+    // EN 1993-1-1, slenderness 1: the tabulated chi of the curves a, b, c.
+    ExpectRel(0.6656 * 235e6, *EnBuckling(member(1.0), 0.21, sheet), 1e-4, "a");
+    ExpectRel(0.5970 * 235e6, *EnBuckling(member(1.0), 0.34, sheet), 1e-4, "b");
+    ExpectRel(0.5399 * 235e6, *EnBuckling(member(1.0), 0.49, sheet), 1e-4, "c");
+    ExpectRel(235e6, *EnBuckling(member(0.2), 0.49, sheet), 1e-12, "stocky");
+    // AISC 360 E3: Fy / Fe is the square of the slenderness.
+    ExpectRel(0.658 * 235e6, *AiscBuckling(member(1.0), sheet), 1e-9, "inelastic");
+    ExpectRel(0.877 / 4.0 * 235e6, *AiscBuckling(member(2.0), sheet), 1e-9, "elastic");
+    T_STEEL_SHAPE s;
+    s.h = 0.3, s.b = 0.15, s.tf = 0.01, s.shape = STEEL_SHAPE::RolledI;
+    EXPECT_EQ(0.21, EnImperfection(s, false, sheet)); // h/b = 2: a, b
+    EXPECT_EQ(0.34, EnImperfection(s, true, sheet));
+    s.b = 0.3;
+    EXPECT_EQ(0.49, EnImperfection(s, true, sheet)); // h/b = 1: b, c
+    s.shape = STEEL_SHAPE::WeldedI;
+    s.tf = 0.05;
+    EXPECT_EQ(0.76, EnImperfection(s, true, sheet)); // thick: c, d
 }

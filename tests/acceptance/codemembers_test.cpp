@@ -1,0 +1,307 @@
+// Hinges that a code gives to steel, round columns and walls, through the program. The numbers come
+// from tests/oracle/codemembers.py, which shares no line with the program.
+#include "hingejson.h"
+
+#include <algorithm>
+#include <cmath>
+#include <map>
+
+namespace {
+
+const double kPi = std::acos(-1.0);
+
+/// Members apart from each other in the plane XZ, cantilevers of 3 m under their axial force, beams
+/// of 6 m and a brace of 5 m between supports.
+json Case()
+{
+    json file = json::parse(R"({"format": "qm-rps case 1",
+        "units": {"force": "kN", "length": "m"}, "plane": "XZ",
+        "design_codes": {"concrete": "Eurocode2:04", "steel": "Eurocode3:05"},
+        "nodes": [{"id": 1, "xyz": [0, 0, 0]}, {"id": 2, "xyz": [0, 0, 3]},
+                  {"id": 3, "xyz": [10, 0, 0]}, {"id": 4, "xyz": [16, 0, 0]},
+                  {"id": 5, "xyz": [20, 0, 0]}, {"id": 6, "xyz": [23, 0, 4]},
+                  {"id": 7, "xyz": [30, 0, 0]}, {"id": 8, "xyz": [30, 0, 3]},
+                  {"id": 9, "xyz": [40, 0, 0]}, {"id": 10, "xyz": [40, 0, 3]}],
+        "materials": [{"name": "S", "type": "steel", "E": 210e6, "nu": 0.3, "fy": 275000,
+                       "knowledge": "KL2", "mean": {"fy": 303000}},
+                      {"name": "C", "type": "concrete", "E": 15e6, "nu": 0.2, "fck": 20000,
+                       "fyk": 400000, "Es": 2e8, "knowledge": "KL2",
+                       "mean": {"fc": 28000, "fy": 450000}}],
+        "sections": [{"name": "H", "shape": "I", "size": [0.2, 0.2, 0.009, 0.015]},
+                     {"name": "I", "shape": "I", "size": [0.3, 0.15, 0.0071, 0.0107]},
+                     {"name": "tube", "shape": "pipe", "size": [0.1397, 0.005]},
+                     {"name": "disc", "shape": "circle", "size": [0.5]},
+                     {"name": "wall", "shape": "rectangle", "size": [2.0, 0.25]}],
+        "elements": [{"id": 1, "nodes": [1, 2], "material": "S", "section": "H"},
+                     {"id": 2, "nodes": [3, 4], "material": "S", "section": "I"},
+                     {"id": 3, "nodes": [5, 6], "kind": "truss", "material": "S",
+                      "section": "tube"},
+                     {"id": 4, "nodes": [7, 8], "material": "C", "section": "disc"},
+                     {"id": 5, "nodes": [9, 10], "material": "C", "section": "wall"}],
+        "load_cases": [{"name": "G", "nodal": [{"node": 2, "load": [0, 0, -400, 0, 0, 0]},
+                                               {"node": 8, "load": [0, 0, -500, 0, 0, 0]},
+                                               {"node": 10, "load": [0, 0, -1000, 0, 0, 0]}]}],
+        "pushover_control": {"initial_loads": [{"case": "G", "factor": 1}]}})");
+    for (const int fixed : {0, 2, 3, 4, 5, 6, 8})
+        file["nodes"][fixed]["restraint"] = {1, 1, 1, 1, 1, 1};
+    const double a = 254.469e-6;
+    for (int k = 0; k < 8; ++k)
+        file["sections"][3]["bars"].push_back(
+            {{"y", 0.2 * std::sin(kPi / 4 * k)}, {"z", 0.2 * std::cos(kPi / 4 * k)}, {"area", a}});
+    for (int k = 0; k < 20; ++k)
+        file["sections"][4]["bars"].push_back(
+            {{"y", k % 2 ? 0.075 : -0.075}, {"z", -0.95 + 1.9 * (k / 2) / 9}, {"area", a}});
+    file["sections"][3]["detailing"] = {
+        {"cover", 0.03}, {"stirrup_diameter", 0.008}, {"stirrup_spacing", 0.1}};
+    file["sections"][4]["detailing"] = {
+        {"cover", 0.03}, {"stirrup_diameter", 0.008}, {"stirrup_spacing", 0.2}};
+    return file;
+}
+
+class CodeMembers : public CProgramTest {
+protected:
+    json Generated(const std::string& code, const std::string& elements) const
+    {
+        Write("c.json", Case().dump(1));
+        return Json("hinge generate c.json --code " + code + " --elements " + elements +
+                    " -o g.json --overwrite");
+    }
+};
+
+TEST_F(CodeMembers, SteelBends)
+{
+    json r = Generated("ASCE41-17", "1");
+    ExpectHinge(HingeOf(r, "My", "+-"),
+                {{"moment", 171.39944750996017},
+                 {"y", 0.007401755202349916},
+                 {"a", 0.021511439021795906},
+                 {"b", 0.05063131902644269},
+                 {"c", 0.7422152972269339},
+                 {"C", 1.0871878565301636},
+                 {"shear", 114.26629833997345},
+                 {"shear_strength", 327.24},
+                 {"CP", 0.05063131902644269}},
+                1e-9, "ASCE 41-17 column");
+    const json type = json::parse(Text("g.json")).at("hinge_types")[0];
+    EXPECT_EQ("user", type.at("interaction")); // follows the axial force: 9/8 (1 - p) from 0.2 on
+    double atLoad = 0.0, atFifth = 0.0, largest = 0.0;
+    const json& curve = type.at("pmm").at("curve_1");
+    for (std::size_t i = 0; i < curve.at("p").size(); ++i) {
+        const double p = curve["p"][i];
+        if (std::fabs(p - 0.17531633641451794) < 1e-9) atLoad = curve["m"][i];
+        if (std::fabs(p + 0.2) < 1e-9) atFifth = curve["m"][i];
+        largest = std::max(largest, curve["m"][i].get<double>());
+    }
+    EXPECT_DOUBLE_EQ(1.0, largest);
+    EXPECT_NEAR(1.0 - 0.17531633641451794 / 2.0, atLoad, 1e-9);
+    EXPECT_NEAR(0.9, atFifth, 1e-9); // in tension, too
+
+    r = Generated("ASCE41-13", "1"); // P/P_CL 0.233: between the ladders
+    ExpectHinge(HingeOf(r, "My", "+-"),
+                {{"moment", 182.81895762350598},
+                 {"P_CL", 1715.7151311347664},
+                 {"theta_y", 0.006690591601222902},
+                 {"a", 11 * (1 - 5.0 / 3.0 * 0.23313893591148885) * 0.006690591601222902}},
+                1e-9, "ASCE 41-13 column");
+    r = Generated("ASCE41-17", "2");
+    ExpectHinge(HingeOf(r, "My", "+-"),
+                {{"moment", 182.43580883699997},
+                 {"a", 0.09774584674362159},
+                 {"b", 0.11946714601998194},
+                 {"shear", 60.81193627899999}},
+                1e-9, "beam");
+    r = Generated("EN1998-3", "1");
+    ExpectHinge(HingeOf(r, "My", "+-"),
+                {{"moment", 137.59926579822618},
+                 {"y", 0.005942119979134502},
+                 {"DL", 0.011884239958269004},
+                 {"SD", 0.04159483985394151},
+                 {"NC", 0.05347907981221052},
+                 {"class", 1.0},
+                 {"shear_strength", 223.04484274468217}},
+                1e-9, "EN 1998-3 column");
+}
+
+TEST_F(CodeMembers, BracesBuckleAndYield)
+{
+    json r = Generated("ASCE41-17", "3");
+    ExpectHinge(HingeOf(r, "Fx", "+"),
+                {{"force", 641.1063836143963}, {"y", 0.007214285714285714}, {"c", 0.8}}, 1e-9, "T");
+    ExpectHinge(HingeOf(r, "Fx", "-"),
+                {{"force", 326.8979636674534},
+                 {"y", 0.003678539739410328},
+                 {"a", 0.0020273208933940384},
+                 {"b", 0.032354653559937455},
+                 {"c", 0.3204484428072558}},
+                1e-9, "C");
+    EXPECT_EQ("truss", json::parse(Text("g.json")).at("hinge_types")[0].at("element"));
+    r = Generated("EN1998-3", "3");
+    ExpectHinge(HingeOf(r, "Fx", "-"), {{"force", 242.7050331329081}, {"NC", 0.019117894450078957}},
+                1e-9, "EN C");
+    ExpectHinge(HingeOf(r, "Fx", "+"), {{"NC", 0.06011904761904762}}, 1e-9, "EN T");
+}
+
+TEST_F(CodeMembers, RoundColumnsHaveTheirOwnRows)
+{
+    json r = Generated("ASCE41-17", "4");
+    const double rho = 2 * kPi / 4 * 0.008 * 0.008 / (0.5 * 0.1);
+    ExpectHinge(HingeOf(r, "My", "+-"),
+                {{"moment", 250.29466403528002},
+                 {"shear_strength", 336.2087712356714},
+                 {"a", 0.03879366746398221},
+                 {"b", 0.06630812684848503},
+                 {"c", 0.20362172729328104},
+                 {"LS", 0.5 * (0.65 / (5 + 0.1 / 0.8 / rho * 28 / 450) - 0.01)}}, // nu >= 0.1
+                2e-5, "ASCE 41-17");
+    r = Generated("EN1998-3", "4");
+    const double phiY = 0.007426079734614177, phiU = 0.12933107325352466, lpl = 0.3037121033435094;
+    // VRd,c = 224 is above My / LV = 147: no shear cracks, aV = 0.
+    const double thetaY =
+        phiY * 1.5 / 3 + 0.0014 * (1 + 1.5 * 0.5 / 1.5) + phiY * 1.3973827576682671 / 8;
+    ExpectHinge(HingeOf(r, "My", "+-"),
+                {{"moment", 219.97703453102233},
+                 {"phi_y", phiY},
+                 {"phi_u", phiU},
+                 {"x", 0.1975114640641673},
+                 {"y", thetaY},
+                 {"NC", (thetaY + (phiU - phiY) * lpl * (1 - 0.5 * lpl / 1.5)) / 1.7}},
+                1e-4, "EN 1998-3");
+}
+
+TEST_F(CodeMembers, WallsFailInShearWhereItComesFirst)
+{
+    json r = Generated("ASCE41-17", "5");
+    EXPECT_EQ("wall", r["types"][0]["member"]);
+    ExpectHinge(HingeOf(r, "My", "+-"),
+                {{"moment", 2698.0805792377823},
+                 {"shear", 1798.7203861585215},
+                 {"shear_strength", 891.7675439074878},
+                 {"a", 0.006},
+                 {"b", 0.010},
+                 {"c", 0.30}},
+                2e-5, "bending, Table 10-19");
+    // Table 10-20, x = 0.071: drifts 0.4, 0.75 and 1.0 % of 3 m, nothing is left.
+    ExpectHinge(HingeOf(r, "Fz", "+-"),
+                {{"force", 891.7675439074878}, {"y", 0.012}, {"a", 0.0105}, {"CP", 0.018}}, 1e-9,
+                "shear");
+    ExpectHolds(r["types"][0]["hinges"][0]["warnings"].dump(),
+                {"not confined", "this storey alone"});
+    EXPECT_EQ("center",
+              json::parse(Text("g.json")).at("hinge_types")[0]["components"]["Fz"]["location"]);
+}
+
+TEST_F(CodeMembers, CurvesByAxialForceAreThoseAtTheirForces)
+{
+    Write("c.json", Case().dump(1));
+    (void)Done("hinge generate c.json --elements 1 --code ASCE41-17 --axial-range -400..400"
+               " -o g.json");
+    const json type = json::parse(Text("g.json")).at("hinge_types")[0];
+    EXPECT_FALSE(type.contains("pmm"));
+    const json& curves = type["components"]["My"]["curve"]["axial_curves"];
+    ASSERT_EQ(7u, curves.size()); // -400, -240, -80, 0, 80, 240, 400
+    const json& first = curves[0];
+    const json& last = curves[6];
+    EXPECT_NEAR(-400.0, first["axial"], 1e-9);
+    EXPECT_NEAR(171.39944750996017, first["positive"]["yield"], 1e-6); // tension bends as much
+    EXPECT_NEAR(171.39944750996017, last["positive"]["yield"], 1e-6);
+    EXPECT_NEAR(0.021511439021795906, last["positive"]["C"]["deform"], 1e-11);
+    EXPECT_NEAR(1.0, curves[3]["positive"]["yield"].get<double>() / 187.87, 1e-4); // Z Fye
+    EXPECT_EQ(std::string::npos, Done("hinge check g.json").find("generated"));
+    (void)ExpectRefused("hinge generate c.json --elements 1 --code EN1998-3 --axial-range 0..9"
+                        " -o no.json",
+                        2, "ASCE 41 and FEMA 356 alone");
+    (void)ExpectRefused("hinge generate c.json --elements 1 --code ASCE41-17 --axial-range 9..0"
+                        " -o no.json",
+                        2, "expected two forces");
+    (void)ExpectRefused("hinge generate c.json --elements 1 --code ASCE41-13 --axial-range 0..1600"
+                        " -o no.json",
+                        3, "at N = ");
+}
+
+TEST_F(CodeMembers, ShearOfAPushIsThatOfItsHinges)
+{
+    const json r = Json("hinge generate @rc-frame-code-hinges --all --code ASCE41-17 --push PX"
+                        " -o g.json --overwrite");
+    ASSERT_LE(2u, r.at("pushes").size());
+    EXPECT_LT(r["pushes"].back()["change"], 0.01);
+    EXPECT_EQ("target reached", r["pushes"][0]["outcome"]);
+    // The foot of column 2 in the push of these hinges, at the first step where it flows.
+    const json push = Json("push g.json --case PX").at(0);
+    std::map<std::string, json> ends;
+    for (const json& hinge : push.at("hinges"))
+        if (hinge.at("element") == 2) ends[hinge.at("end")] = hinge;
+    std::size_t at = 0;
+    while (ends["I"].at("state")[at] == "elastic")
+        ++at;
+    const double foot = ends["I"].at("force")[at], head = ends["J"].at("force")[at];
+    for (const json& type : r.at("types")) {
+        const std::vector<int> elements = type.at("elements");
+        if (std::ranges::count(elements, 2) == 0) continue;
+        for (const json& hinge : type.at("hinges")) {
+            if (hinge.at("end") != "I") continue;
+            ExpectHinge(hinge, {{"V", std::fabs(foot - head) / 2.95}}, 0.01, "V");
+            ExpectHinge(hinge, {{"LV", std::fabs(foot) * 2.95 / std::fabs(foot - head)}}, 0.02,
+                        "LV");
+        }
+    }
+    EXPECT_EQ(std::string::npos, Done("hinge check g.json").find("generated"));
+    (void)ExpectRefused("hinge generate @rc-frame-code-hinges --all --code ASCE41-17 --push NO"
+                        " -o no.json",
+                        3, "there is no pushover load case NO");
+}
+
+TEST_F(CodeMembers, AreRefusedWhereTheCodeHasNoRow)
+{
+    const struct {
+        const char *pointer, *value, *says, *options;
+    } bad[] = {
+        {"/sections/0/shape", "\"box\"", "Element 1: shape: I", "ASCE41-17 --elements 1"},
+        {"/sections/0/size", "[0.2, 0.4, 0.009, 0.008]", "Element 1: sectionClass",
+         "EN1998-3 --elements 1"},
+        {"/load_cases/0/nodal/0/load/2", "-1200", "force-controlled", "ASCE41-13 --elements 1"},
+        {"/load_cases/0/nodal/0/load/2", "-1200", "axialRatio: must lie within",
+         "EN1998-3 --elements 1"},
+        {"/load_cases/0/nodal/0/load/2", "-2500", "does not carry the axial force",
+         "ASCE41-17 --elements 1"},
+        {"/materials/0/knowledge", "null", "Element 1: knowledge", "EN1998-3 --elements 1"},
+        {"/materials/1/type", "\"masonry\"", "Element 4: ", "ASCE41-17 --elements 4"},
+        {"/materials/0/fy", "0", "Fy: must be above 0", "ASCE41-17 --elements 3"},
+        {"/elements/4/nodes", "[9, 10]", "wall: FEMA356 has no row", "FEMA356 --elements 5"},
+    };
+    for (const auto& b : bad) {
+        json file = Case();
+        const json::json_pointer at(b.pointer);
+        const json value = json::parse(b.value);
+        if (value.is_null())
+            file[at.parent_pointer()].erase(at.back());
+        else
+            file[at] = value;
+        if (std::string(b.says).starts_with("Fy")) file["materials"][0].erase("mean");
+        Write("bad.json", file.dump(1));
+        (void)ExpectRefused(std::string("hinge generate bad.json -o no.json --code ") + b.options,
+                            3, b.says);
+    }
+    // Without a mean the characteristic value counts, and that is said.
+    json file = Case();
+    file["materials"][0].erase("mean");
+    Write("c.json", file.dump(1));
+    const json r = Json("hinge generate c.json --code EN1998-3 --elements 2 -o g.json --overwrite");
+    ExpectHolds(r.dump(), {"no mean value is given for S"});
+    ExpectHinge(HingeOf(r, "My", "+-"), {{"moment", 182.43580883699997 / 303 * 275 / 1.2}}, 1e-9,
+                "Fy/CF");
+}
+
+TEST_F(CodeMembers, CarryTheSteelExampleToItsTarget)
+{
+    for (const char* const code : {"ASCE41-17", "EN1998-3", "Circolare2019", "FEMA356"}) {
+        const std::string said =
+            Done(std::string("hinge generate @steel-frame-code-hinges --all -o g.json"
+                             " --overwrite --code ") +
+                 code);
+        ExpectHolds(said, {"18 elements have hinges of 6 types"});
+        EXPECT_EQ(std::string::npos, Done("hinge check g.json").find("generated")) << code;
+        EXPECT_EQ("reached", Json("push g.json --case PX").at(0).at("status")) << code;
+    }
+}
+
+} // namespace
