@@ -15,6 +15,7 @@ bool Positive(double v)
 bool SoundSize(const T_SECT_D& s)
 {
     const auto& [a, b, c, d] = s.size;
+    if (!FilletFits(s)) return false;
     switch (s.shape) {
     case SECT_SHAPE::Value:
         return true;
@@ -56,6 +57,43 @@ T_MOMENTS Sum(const std::vector<T_SECT_PIECE>& pieces)
         m.Z += p.sign * (p.round ? d2 * d / 6.0 : p.width * d2 / 4.0);
     }
     return m;
+}
+
+/// What lies between the two sides of a right angle and a quarter circle that touches both: area,
+/// distance of its centroid from the sides, second moment about the centroid.
+struct T_SPANDREL {
+    explicit T_SPANDREL(double r)
+        : area((1.0 - pi / 4.0) * r * r), place((10.0 - 3.0 * pi) / (12.0 - 3.0 * pi) * r),
+          own((1.0 / 3.0 - pi / 16.0 - 1.0 / (9.0 * (4.0 - pi))) * std::pow(r, 4))
+    {
+    }
+    double area, place, own;
+};
+
+/// Adds four spandrels whose centroids lie at this distance from the axis, or takes them off.
+void AddFour(const T_SPANDREL& piece, double distance, double sign, T_MOMENTS& m)
+{
+    m.area += sign * 4.0 * piece.area;
+    m.I += sign * 4.0 * (piece.own + piece.area * distance * distance);
+    m.Z += sign * 4.0 * piece.area * distance;
+}
+
+/// Fillets of an I; corners of a box, whose outer ones are missing.
+void AddFillets(const T_SECT_D& s, T_MOMENTS& y, T_MOMENTS& z)
+{
+    const auto& [a, b, c, d] = s.size;
+    const T_SPANDREL outer(s.fillet);
+    if (s.shape == SECT_SHAPE::IShape) {
+        AddFour(outer, a / 2.0 - d - outer.place, 1.0, y);
+        AddFour(outer, c / 2.0 + outer.place, 1.0, z);
+    }
+    if (s.shape == SECT_SHAPE::Box) {
+        const T_SPANDREL inner(InnerRadius(s));
+        AddFour(outer, a / 2.0 - outer.place, -1.0, y);
+        AddFour(outer, b / 2.0 - outer.place, -1.0, z);
+        AddFour(inner, a / 2.0 - d - inner.place, 1.0, y);
+        AddFour(inner, b / 2.0 - c - inner.place, 1.0, z);
+    }
 }
 
 /// Saint-Venant torsion of a solid rectangle, Timoshenko and Goodier (1970) section 109: series;
@@ -159,7 +197,8 @@ int CSectionProperties::Calc(const T_SECT_D& in, T_SECT_D& out, SECT_FAULT& faul
     if (fault != SECT_FAULT::None) return 0;
     T_SECT_D s = in;
     if (s.shape != SECT_SHAPE::Value) {
-        const T_MOMENTS y = Sum(Pieces(s, true)), z = Sum(Pieces(s, false));
+        T_MOMENTS y = Sum(Pieces(s, true)), z = Sum(Pieces(s, false));
+        if (s.fillet > 0.0) AddFillets(s, y, z);
         s.area = y.area;
         s.Iyy = y.I;
         s.Izz = z.I;
@@ -183,12 +222,15 @@ T_SHEAR_AREAS CSectionProperties::StrengthShearAreas(const T_SECT_D& section)
     case SECT_SHAPE::Pipe:
         return {2.0 / pi * section.area, 2.0 / pi * section.area};
     case SECT_SHAPE::Box: {
+        if (section.fillet > 0.0) return {section.area * b / (a + b), section.area * a / (a + b)};
         const double webs = 2.0 * (a - 2.0 * d) * c;
         return {section.area - webs, webs};
     }
     case SECT_SHAPE::IShape: {
         const double web = (a - 2.0 * d) * c;
-        return {section.area - web, web};
+        if (section.fillet == 0.0) return {section.area - web, web};
+        const double rolled = section.area - 2.0 * b * d + (c + 2.0 * section.fillet) * d;
+        return {section.area - web, std::max(rolled, web)};
     }
     case SECT_SHAPE::Value:
         break;

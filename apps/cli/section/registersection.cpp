@@ -2,6 +2,7 @@
 #include "registershared.h"
 #include "registrations.h"
 #include "section/sectioncommands.h"
+#include "section/sectionlibrary.h"
 
 namespace {
 
@@ -64,6 +65,18 @@ void AddTask(const T_GROUP& group, SECTION_TASK task, const char* help, const ch
     AddOverwrite(sub, o->overwrite);
 }
 
+void AddLibrary(CLI::App* section, EXIT_CODE& code)
+{
+    auto* shapes = section->add_subcommand("shapes", Say("IDS_QM_HELP_SECC_SHAPES"));
+    const auto find = std::make_shared<std::string>();
+    shapes->add_option("--find", *find, Say("IDS_QM_HELP_SECC_FIND"));
+    AddExample(shapes, "section shapes --find \"IPE 3\"");
+    shapes->callback([find, &code] { code = RunSectionShapes(*find); });
+    auto* grades = section->add_subcommand("grades", Say("IDS_QM_HELP_SECC_GRADES"));
+    AddExample(grades, "section grades");
+    grades->callback([&code] { code = RunSectionGrades(); });
+}
+
 } // namespace
 
 void AddSection(CLI::App& app, EXIT_CODE& code)
@@ -80,4 +93,5 @@ void AddSection(CLI::App& app, EXIT_CODE& code)
             " --section \"column 40x40\" --values design");
     AddTask(group, SECTION_TASK::Surface, "IDS_QM_HELP_SECC_SURFACE",
             " --section \"column 40x40\" --axial 0 400 800 --json -");
+    AddLibrary(section, code);
 }

@@ -57,6 +57,14 @@ public:
         return m_in.Has(key);
     }
 
+    /// The text of the member; "" where it has another type.
+    std::string TextOf(const char* key)
+    {
+        std::string text;
+        if (m_in.Member(key).IsText()) m_in.Member(key).Read(text);
+        return text;
+    }
+
     /// A fault at once when the member is missing.
     void Must(const char* key)
     {

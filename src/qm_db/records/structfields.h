@@ -2,6 +2,8 @@
 #pragma once
 
 #include "qm_db/records/fieldwords.h"
+#include "qm_db/records/matgrades.h"
+#include "qm_db/records/steelshapes.h"
 
 inline constexpr T_DIM kDimArea{0, 2};
 inline constexpr T_DIM kDimModulus{0, 3};
@@ -160,6 +162,11 @@ void CaseFields(V& v, T_FIELD_REF<V, T_MATL_D> r)
     v.OptIf("confidence_factor", r.confidence);
     v.Check("confidence_factor", r.confidence.value_or(1.0) >= 1.0, "IDS_QM_CASE_CONFIDENCE");
     v.PartIf("masonry", r.masonry);
+    // A case file may name a grade; what is written are its values.
+    if constexpr (requires { v.TextOf("grade"); })
+        if (v.Has("grade"))
+            v.Check("grade", FillFromGrades(v.TextOf("grade"), v.Has("type"), r),
+                    "IDS_QM_CASE_GRADE");
 }
 
 template <class V>
@@ -204,8 +211,21 @@ void CaseFields(V& v, T_FIELD_REF<V, T_SECT_FACTORS> r)
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_SECT_D> r)
 {
-    v.EnumOpt("shape", r.shape, SECT_SHAPE::Value, kShapeNames, "IDS_QM_CHOICE_SHAPE");
+    // A case file may name a steel shape; what is written are its dimensions.
+    std::optional<T_SECT_D> named;
+    if constexpr (requires { v.TextOf("shape"); })
+        if (v.Has("shape")) named = NamedShape(v.TextOf("shape"));
+    if (!named) v.EnumOpt("shape", r.shape, SECT_SHAPE::Value, kShapeNames, "IDS_QM_CHOICE_SHAPE");
     v.Padded("size", r.size, kDimLength);
+    v.Opt("fillet", r.fillet, 0.0, kDimLength);
+    v.Check("fillet", FilletFits(r), "IDS_QM_CASE_FILLET");
+    if constexpr (V::kReads) {
+        if (named) {
+            v.Check("size", !v.Has("size"), "IDS_QM_CASE_SHAPE_SIZE");
+            v.Check("fillet", !v.Has("fillet"), "IDS_QM_CASE_SHAPE_SIZE");
+            r.shape = named->shape, r.size = named->size, r.fillet = named->fillet;
+        }
+    }
     const auto property = [&](const char* key, const char* old, auto& value, T_DIM dim) {
         const char* const used = v.OptOr(key, old, value, 0.0, dim);
         v.Check(used, value >= 0.0, kNotNegative);

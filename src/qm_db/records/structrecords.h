@@ -100,9 +100,29 @@ struct T_SECT_D {
     T_SECT_FACTORS factorsI, factorsJ;
     std::vector<T_REBAR> bars; // concrete
     std::optional<T_SECT_DETAIL> detailing{};
+    /// I: radius where flange and web meet. Box: outer radius of the corners; the inner one is less
+    /// by the wall, at least the wall. 0: sharp (welded).
+    double fillet = 0.0;
     bool operator==(const T_SECT_D&) const = default;
 };
 
+/// Inner radius of a box with rounded corners, see T_SECT_D::fillet.
+inline double InnerRadius(const T_SECT_D& box)
+{
+    const double wall = std::max(box.size[2], box.size[3]);
+    return box.fillet > 0.0 ? std::max(box.fillet - wall, wall) : 0.0;
+}
+/// The fillet has room; only an I and a box have one.
+inline bool FilletFits(const T_SECT_D& s)
+{
+    if (s.fillet == 0.0) return true;
+    const auto& [a, b, c, d] = s.size;
+    if (!(s.fillet > 0.0)) return false;
+    if (s.shape == SECT_SHAPE::IShape) return s.fillet <= 0.5 * (b - c) && s.fillet <= 0.5 * a - d;
+    if (s.shape != SECT_SHAPE::Box) return false;
+    return 2.0 * s.fillet <= std::min(a, b) &&
+           2.0 * InnerRadius(s) <= std::min(b - 2.0 * c, a - 2.0 * d);
+}
 /// Of a rectangle with detailing: the stirrups leave a core within the cover.
 inline bool LeavesCore(const T_SECT_D& s)
 {

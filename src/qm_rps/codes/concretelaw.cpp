@@ -41,7 +41,8 @@ std::optional<T_CONCRETE_CLASS> ConcreteClass(double fck, CCodeSheet& sheet)
     c.fctm = stress("fctm", fctm, "0.30 fck^(2/3); > C50: 2.12 ln(1 + fcm/10)", S2);
     c.fctk005 = stress("fctk,0.05", 0.7 * fctm, "0.7 fctm", S2);
     c.fctk095 = stress("fctk,0.95", 1.3 * fctm, "1.3 fctm", S2);
-    c.Ecm = stress("Ecm", 22000.0 * std::pow(fcm / 10.0, 0.3), "22 (fcm/10)^0.3 GPa", S2);
+    c.Ecm = stress("Ecm", ConcreteModulus(fcm * kPascalsPerMpa) / kPascalsPerMpa,
+                   "22 (fcm/10)^0.3 GPa", S2);
     c.bilinearStrain = sheet.Put("eps_c3", (1.75 + 0.55 * above / 40.0) / 1000.0, kTable,
                                  "1.75 + 0.55 (fck - 50)/40", S2);
     c.lambda = sheet.Put("lambda", 0.8 - above / 400.0, kTable, "0.8 - (fck - 50)/400", S2);

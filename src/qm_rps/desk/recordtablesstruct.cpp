@@ -97,6 +97,7 @@ T_RECORD_COLUMNS<T_SECT_D> SectionColumns()
     add("Izz", kInertia, &R::Izz);
     add("Zy", kModulus, &R::Zy);
     add("Zz", kModulus, &R::Zz);
+    add("r", kDimLength, &R::fillet);
     return c;
 }
 

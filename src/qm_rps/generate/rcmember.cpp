@@ -48,8 +48,8 @@ T_RC_MATERIAL Divided(const T_MATL_MEAN& mean, double factor, CCodeSheet& sheet)
     r.fy = put("fy", mean.fy, "mean.fy/CF");
     r.fyw =
         mean.fyw > 0.0 ? put("fyw", mean.fyw, "mean.fyw/CF") : put("fyw", mean.fy, "mean.fy/CF");
-    r.Ec = sheet.Put("Ec", 22e9 * std::pow(mean.fc / kPascalsPerMpa / 10.0, 0.3), kDimStress,
-                     "EN 1992-1-1 Table 3.1", "22 (mean.fc/10)^0.3 GPa", CODE_MARK::SightedTwice);
+    r.Ec = sheet.Put("Ec", ConcreteModulus(mean.fc), kDimStress, "EN 1992-1-1 Table 3.1",
+                     "22 (mean.fc/10)^0.3 GPa", CODE_MARK::SightedTwice);
     return r;
 }
 

@@ -9,10 +9,22 @@ namespace {
 
 using namespace solver;
 
+/// tan(pi / 8): bulge of a quarter circle.
+constexpr double kQuarter = std::numbers::sqrt2 - 1.0;
+
 T_RING Rectangle(double width, double depth)
 {
     const double y = width / 2.0, z = depth / 2.0;
     return {{-y, -z}, {y, -z}, {y, z}, {-y, z}};
+}
+
+/// Corners rounded with a radius.
+T_RING Rounded(double width, double depth, double radius)
+{
+    if (!(radius > 0.0)) return Rectangle(width, depth);
+    const double y = width / 2.0, z = depth / 2.0, r = radius, left = kQuarter;
+    return {{-y + r, -z}, {y - r, -z, left}, {y, -z + r}, {y, z - r, left},
+            {y - r, z},   {-y + r, z, left}, {-y, z - r}, {-y, -z + r, left}};
 }
 
 T_RING Circle(double diameter)
@@ -20,10 +32,19 @@ T_RING Circle(double diameter)
     return {{diameter / 2.0, 0.0, 1.0}, {-diameter / 2.0, 0.0, 1.0}};
 }
 
-/// Height a, width b, web c, flanges d.
-T_RING IShape(double a, double b, double c, double d)
+/// Height a, width b, web c, flanges d, fillets r.
+T_RING IShape(double a, double b, double c, double d, double r)
 {
     const double y = b / 2.0, w = c / 2.0, z = a / 2.0, f = z - d;
+    if (r > 0.0)
+        return {{-y, -z},     {y, -z},
+                {y, -f},      {w + r, -f, -kQuarter},
+                {w, -f + r},  {w, f - r, -kQuarter},
+                {w + r, f},   {y, f},
+                {y, z},       {-y, z},
+                {-y, f},      {-w - r, f, -kQuarter},
+                {-w, f - r},  {-w, -f + r, -kQuarter},
+                {-w - r, -f}, {-y, -f}};
     return {{-y, -z}, {y, -z}, {y, -f}, {w, -f}, {w, f},   {y, f},
             {y, z},   {-y, z}, {-y, f}, {-w, f}, {-w, -f}, {-y, -f}};
 }
@@ -41,9 +62,10 @@ std::vector<T_RING> SectionRings(const T_SECT_D& section)
     case SECT_SHAPE::Pipe:
         return {Circle(a), Circle(a - 2.0 * b)};
     case SECT_SHAPE::Box:
-        return {Rectangle(b, a), Rectangle(b - 2.0 * c, a - 2.0 * d)};
+        return {Rounded(b, a, section.fillet),
+                Rounded(b - 2.0 * c, a - 2.0 * d, InnerRadius(section))};
     case SECT_SHAPE::IShape:
-        return {IShape(a, b, c, d)};
+        return {IShape(a, b, c, d, section.fillet)};
     case SECT_SHAPE::Value:
         break;
     }

@@ -1,6 +1,7 @@
 // Sections of the records by every kind of strengths, against hand calculation.
 #include "qm_rps/section/sectionexport.h"
 
+#include "qm_db/sectionproperties.h"
 #include "qm_rps/outline/sectionoutline.h"
 
 #include <gtest/gtest.h>
@@ -278,6 +279,24 @@ TEST(SectionCurves, StrainsAreThoseOfTheEdgeInEveryDirection)
     EXPECT_NEAR(0.5, ExtentAlong(arc, pi / 4.0).high, 1e-12);
     EXPECT_NEAR(0.5, ExtentAlong(arc, 0.0).high, 1e-12);
     EXPECT_NEAR(-0.4 / std::sqrt(2.0), ExtentAlong(arc, pi / 4.0).low, 1e-12);
+}
+
+// The properties add pieces of the shape, the calculator integrates its outline with its arcs.
+TEST(SectionCurves, RolledAndHollowShapesHaveTheStrengthOfTheirProperties)
+{
+    for (const char* name :
+         {"IPE 300", "HEM 100", "SHS 100x5", "RHS 200x100x8", "CFRHS 200x100x8"}) {
+        T_SECT_D s = *NamedShape(name), properties;
+        SECT_FAULT fault = SECT_FAULT::None;
+        ASSERT_EQ(1, CSectionProperties::Calc(s, properties, fault));
+        T_SECTION_REQUEST request;
+        request.directions = {0.0, pi / 2.0};
+        const T_SECTION_ANSWER answer = Answer(s, Steel(), request);
+        EXPECT_NEAR(properties.area * 275e6, answer.compression, 1e-9 * answer.compression) << name;
+        const double My = answer.capacities.at(0).at.My, Mz = answer.capacities.at(1).at.Mz;
+        EXPECT_NEAR(properties.Zy * 275e6, My, 1e-9 * My) << name;
+        EXPECT_NEAR(properties.Zz * 275e6, Mz, 1e-9 * Mz) << name;
+    }
 }
 
 TEST(SectionCurves, FilesHaveEveryPointWithItsSection)

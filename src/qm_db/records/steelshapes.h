@@ -1,0 +1,20 @@
+// Rolled and hollow steel shapes by name.
+#pragma once
+
+#include "qm_db/records/structrecords.h"
+
+#include <span>
+
+/// A rolled shape; lengths in m.
+struct T_STEEL_SHAPE {
+    const char* name = ""; // "IPE 300"
+    double height = 0.0, width = 0.0, web = 0.0, flange = 0.0, fillet = 0.0;
+};
+std::span<const T_STEEL_SHAPE> SteelShapes();
+
+/// Shape, sizes (m) and fillet of a named section: one of SteelShapes, or a hollow one with its
+/// dimensions in mm: "CHS 168.3x8", "SHS 100x5", "RHS 200x100x8" (hot finished, EN 10210-2, corners
+/// of 1.5 and 1 times the wall), "CFSHS", "CFRHS" (cold formed, EN 10219-2: 2 and 1 times up to 6
+/// mm, 2.5 and 1.5 times up to 10 mm, no thicker ones). Blanks and case do not matter. None: there
+/// is no such shape.
+std::optional<T_SECT_D> NamedShape(const std::string& name);
