@@ -3,10 +3,9 @@
 
 #include "qm_db/records/hingerecords.h"
 #include "qm_db/records/loadrecords.h"
-#include "qm_db/records/matgrades.h"
+#include "qm_db/records/namedrecords.h"
 #include "qm_db/records/pushrecords.h"
 #include "qm_db/records/stagerecords.h"
-#include "qm_db/records/steelshapes.h"
 #include "qm_db/records/units.h"
 
 #include <array>

@@ -2,8 +2,7 @@
 #pragma once
 
 #include "qm_db/records/fieldwords.h"
-#include "qm_db/records/matgrades.h"
-#include "qm_db/records/steelshapes.h"
+#include "qm_db/records/namedrecords.h"
 
 inline constexpr T_DIM kDimArea{0, 2};
 inline constexpr T_DIM kDimModulus{0, 3};

@@ -1,8 +1,9 @@
-#include "qm_db/records/steelshapes.h"
+#include "qm_db/stock/steelshapes.h"
 
 #include "qm_base/textformat.h"
 
 #include <cctype>
+#include <vector>
 
 namespace {
 
@@ -121,17 +122,8 @@ std::vector<double> Dimensions(const std::string& text)
     return out;
 }
 
-T_SECT_D Box(double height, double width, double wall, double corner)
-{
-    T_SECT_D s;
-    s.shape = SECT_SHAPE::Box;
-    s.size = {height, width, wall, wall};
-    s.fillet = corner;
-    return s;
-}
-
 /// "CHS", "SHS", "RHS" with what follows.
-std::optional<T_SECT_D> Hollow(const std::string& plain)
+std::optional<T_STOCK_SHAPE> Hollow(const std::string& plain)
 {
     const bool cold = plain.starts_with("CF");
     const std::string rest = plain.substr(cold ? 2 : 0);
@@ -142,10 +134,7 @@ std::optional<T_SECT_D> Hollow(const std::string& plain)
     const double wall = size.back();
     if (kind == "CHS") {
         if (size.size() != 2 || !(2.0 * wall < size[0])) return {};
-        T_SECT_D s;
-        s.shape = SECT_SHAPE::Pipe;
-        s.size = {size[0], wall, 0.0, 0.0};
-        return s;
+        return T_STOCK_SHAPE{STOCK_SHAPE::Pipe, {size[0], wall, 0.0, 0.0}, 0.0};
     }
     const bool square =
         kind == "SHS" && (size.size() == 2 || (size.size() == 3 && size[0] == size[1]));
@@ -155,7 +144,7 @@ std::optional<T_SECT_D> Hollow(const std::string& plain)
     const double corner = (!cold ? 1.5 : wall <= 6.0 * kMm * kEven ? 2.0 : 2.5) * wall;
     const double height = size[0], width = size[size.size() - 2];
     if (!(2.0 * corner < std::min(height, width))) return {};
-    return Box(height, width, wall, corner);
+    return T_STOCK_SHAPE{STOCK_SHAPE::Box, {height, width, wall, wall}, corner};
 }
 
 } // namespace
@@ -172,16 +161,11 @@ std::span<const T_STEEL_SHAPE> SteelShapes()
     return kShapes;
 }
 
-std::optional<T_SECT_D> NamedShape(const std::string& name)
+std::optional<T_STOCK_SHAPE> FindShape(const std::string& name)
 {
     const std::string plain = Plain(name);
-    for (const T_STEEL_SHAPE& shape : SteelShapes()) {
-        if (Plain(shape.name) != plain) continue;
-        T_SECT_D s;
-        s.shape = SECT_SHAPE::IShape;
-        s.size = {shape.height, shape.width, shape.web, shape.flange};
-        s.fillet = shape.fillet;
-        return s;
-    }
+    for (const T_STEEL_SHAPE& s : SteelShapes())
+        if (Plain(s.name) == plain)
+            return T_STOCK_SHAPE{STOCK_SHAPE::I, {s.height, s.width, s.web, s.flange}, s.fillet};
     return Hollow(plain);
 }

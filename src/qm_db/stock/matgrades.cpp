@@ -1,9 +1,8 @@
-#include "qm_db/records/matgrades.h"
-
-#include "qm_base/textformat.h"
+#include "qm_db/stock/matgrades.h"
 
 #include <cmath>
-#include <sstream>
+#include <utility>
+#include <vector>
 
 namespace {
 
@@ -47,8 +46,8 @@ constexpr double kSteelNu = 0.3, kConcreteNu = 0.2, kSteelAlpha = 1.2e-5, kConcr
 
 T_MATL_GRADE Concrete(std::string name, std::string clause, double strength, double modulus)
 {
-    return {std::move(name), std::move(clause), MATL_CLASS::Concrete, false,         strength,
-            modulus,         kConcreteNu,       kConcreteDensity,     kConcreteAlpha};
+    return {std::move(name), std::move(clause), GRADE_OF::Concrete, strength,
+            modulus,         kConcreteNu,       kConcreteDensity,   kConcreteAlpha};
 }
 
 std::vector<T_MATL_GRADE> MakeGrades()
@@ -62,35 +61,9 @@ std::vector<T_MATL_GRADE> MakeGrades()
         out.push_back(Concrete(std::to_string(psi) + "psi", "ACI 318-19 19.2.2.1", psi * kPsi,
                                57000.0 * std::sqrt(psi) * kPsi));
     for (const T_STEEL_ROW& row : kSteel)
-        out.push_back({row.name, row.clause, MATL_CLASS::Steel, row.bars, row.strength, row.modulus,
-                       kSteelNu, kSteelDensity, kSteelAlpha});
+        out.push_back({row.name, row.clause, row.bars ? GRADE_OF::Bars : GRADE_OF::Steel,
+                       row.strength, row.modulus, kSteelNu, kSteelDensity, kSteelAlpha});
     return out;
-}
-
-const T_MATL_GRADE* Find(const std::string& name)
-{
-    for (const T_MATL_GRADE& grade : MaterialGrades())
-        if (grade.name == name) return &grade;
-    return nullptr;
-}
-
-void Fill(double& value, double by)
-{
-    if (value == 0.0) value = by;
-}
-
-void Fill(const T_MATL_GRADE& grade, T_MATL_D& m)
-{
-    if (grade.bars) {
-        Fill(m.fyk, grade.strength);
-        Fill(m.Es, grade.modulus);
-        return;
-    }
-    Fill(grade.type == MATL_CLASS::Concrete ? m.fck : m.Fy, grade.strength);
-    Fill(m.E, grade.modulus);
-    Fill(m.nu, grade.nu);
-    Fill(m.density, grade.density);
-    Fill(m.alpha, grade.alpha);
 }
 
 } // namespace
@@ -106,21 +79,9 @@ std::span<const T_MATL_GRADE> MaterialGrades()
     return kGrades;
 }
 
-bool FillFromGrades(const std::string& names, bool typed, T_MATL_D& material)
+const T_MATL_GRADE* FindGrade(const std::string& name)
 {
-    std::istringstream words(names);
-    T_MATL_D filled = material;
-    bool any = false, bars = false;
-    for (std::string word; words >> word;) {
-        const T_MATL_GRADE* const grade = Find(word);
-        if (!grade || (grade->bars ? bars : any)) return false;
-        (grade->bars ? bars : any) = true;
-        if (!grade->bars && !typed) filled.type = grade->type;
-        if (!grade->bars && grade->type != filled.type) return false;
-        Fill(*grade, filled);
-    }
-    // Bars stand in concrete; alone they need a material that is said to be of it.
-    if (!(any || bars) || (bars && filled.type != MATL_CLASS::Concrete)) return false;
-    material = filled;
-    return true;
+    for (const T_MATL_GRADE& grade : MaterialGrades())
+        if (grade.name == name) return &grade;
+    return nullptr;
 }
