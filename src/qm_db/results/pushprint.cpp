@@ -36,7 +36,7 @@ public:
             T_STRENGTHS crack, yield, crackJ, yieldJ;
         };
         static_assert(sizeof(T_BYTES) == 2 * sizeof(int) + 48 * sizeof(double)); // nothing between
-        static_assert(sizeof hinge == sizeof(T_BYTES) + sizeof(double)); // and axialCase
+        static_assert(sizeof hinge == sizeof(T_BYTES) + sizeof(double));         // and axialCase
         const T_BYTES bytes{hinge.element, hinge.hingeType, hinge.crack,
                             hinge.yield,   hinge.crackJ,    hinge.yieldJ};
         m_sum.AddBytes(std::as_bytes(std::span(&bytes, 1)));
