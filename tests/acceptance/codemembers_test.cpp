@@ -184,6 +184,10 @@ TEST_F(CodeMembers, WallsFailInShearWhereItComesFirst)
     ExpectHinge(HingeOf(r, "Fz", "+-"),
                 {{"force", 891.7675439074878}, {"y", 0.012}, {"a", 0.0105}, {"CP", 0.018}}, 1e-9,
                 "shear");
+    int metres = 0;
+    for (const json& line : HingeOf(r, "Fz", "+-").at("trace"))
+        metres += line.at("symbol") == "D(B)" && line.at("unit") == "m" ? 1 : 0;
+    EXPECT_EQ(1, metres); // beside the rotation of bending
     ExpectHolds(r["types"][0]["hinges"][0]["warnings"].dump(),
                 {"not confined", "this storey alone"});
     EXPECT_EQ("center",

@@ -98,5 +98,6 @@ struct T_ASCE_WALL_SHEAR {
 };
 std::optional<T_ASCE_WALL_SHEAR> AsceWallShear(const T_ASCE_WALL& wall, CCodeSheet& sheet);
 /// B at the drift g, where the strength is the yield strength; the elastic line ends at f of it.
+/// `dim`: of the drifts, a length where they are displacements.
 std::optional<T_CODE_BACKBONE> BackboneOfWallShear(const T_ASCE_WALL_SHEAR& wall, double yield,
-                                                   CCodeSheet& sheet);
+                                                   CCodeSheet& sheet, T_DIM dim = kDimNone);

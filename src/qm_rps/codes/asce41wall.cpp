@@ -106,7 +106,7 @@ std::optional<T_ASCE_WALL_SHEAR> AsceWallShear(const T_ASCE_WALL& wall, CCodeShe
 }
 
 std::optional<T_CODE_BACKBONE> BackboneOfWallShear(const T_ASCE_WALL_SHEAR& wall, double yield,
-                                                   CCodeSheet& sheet)
+                                                   CCodeSheet& sheet, T_DIM dim)
 {
     if (wall.forceControlled) {
         sheet.Refuse(CODE_REASON::NoRow, "axial", kShearTable);
@@ -117,6 +117,7 @@ std::optional<T_CODE_BACKBONE> BackboneOfWallShear(const T_ASCE_WALL_SHEAR& wall
     T_BACKBONE_IN in;
     in.yield = yield;
     in.yieldDeform = wall.g;
+    in.dim = dim;
     std::optional<T_CODE_BACKBONE> bone = BackboneOfPlastic(beyondYield, in, sheet);
     if (bone) bone->crackStrength = wall.f;
     return bone;

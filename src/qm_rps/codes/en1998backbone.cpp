@@ -1,6 +1,6 @@
 #include "qm_rps/codes/en1998backbone.h"
 
-std::optional<T_EN_HINGE> EnHinge(const T_EN_HINGE_IN& in, CCodeSheet& sheet)
+std::optional<T_EN_ROTATIONS> EnRotations(const T_EN_HINGE_IN& in, CCodeSheet& sheet)
 {
     const T_EN_MEMBER& m = in.member;
     if (!sheet.NotNegative({{"concreteShear", in.concreteShear}})) return {};
@@ -15,15 +15,23 @@ std::optional<T_EN_HINGE> EnHinge(const T_EN_HINGE_IN& in, CCodeSheet& sheet)
     const std::optional<double> thetaUm = EnThetaUm(m, sheet);
     if (!thetaY || !thetaUm) return {};
 
-    std::optional<T_CHORD_LIMITS> limits = EnChordLimits(*thetaY, *thetaUm, m.basis, sheet);
+    const std::optional<T_CHORD_LIMITS> limits = EnChordLimits(*thetaY, *thetaUm, m.basis, sheet);
     if (!limits) return {};
-    limits->residual = in.residual;
+    return T_EN_ROTATIONS{*yield, *thetaY, *thetaUm, *limits};
+}
+
+std::optional<T_EN_HINGE> EnHinge(const T_EN_HINGE_IN& in, CCodeSheet& sheet)
+{
+    std::optional<T_EN_ROTATIONS> found = EnRotations(in, sheet);
+    if (!found) return {};
+    T_CHORD_LIMITS& limits = found->limits;
+    limits.residual = in.residual;
     T_BACKBONE_IN curve;
-    curve.yield = yield->moment;
-    curve.yieldDeform = *thetaY;
+    curve.yield = found->yield.moment;
+    curve.yieldDeform = found->thetaY;
     curve.slope = in.strengthCap > 1.0 ? 1.0 : 0.0; // up to the cap, which is reached at theta_um
     curve.strengthCap = in.strengthCap;
-    const std::optional<T_CODE_BACKBONE> bone = BackboneOfChord(*limits, curve, sheet);
+    const std::optional<T_CODE_BACKBONE> bone = BackboneOfChord(limits, curve, sheet);
     if (!bone) return {};
-    return T_EN_HINGE{*yield, *thetaY, *thetaUm, *bone};
+    return T_EN_HINGE{found->yield, found->thetaY, found->thetaUm, *bone};
 }

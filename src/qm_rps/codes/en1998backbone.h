@@ -10,6 +10,13 @@ struct T_EN_HINGE_IN {
     double strengthCap = 0.0;     // ultimate over yield moment; 0: C at the yield strength
     double residual = 0.0;        // beyond theta_um, over the yield strength
 };
+struct T_EN_ROTATIONS {
+    T_EN_YIELD yield;
+    double thetaY = 0.0, thetaUm = 0.0;
+    T_CHORD_LIMITS limits;
+};
+std::optional<T_EN_ROTATIONS> EnRotations(const T_EN_HINGE_IN& in, CCodeSheet& sheet);
+
 struct T_EN_HINGE {
     T_EN_YIELD yield;
     double thetaY = 0.0, thetaUm = 0.0;

@@ -212,10 +212,13 @@ int CCodeHinges::GenerateFromPush(T_CODE_REQUEST request, int loadCase, T_CODE_H
         auto now = PushedShears(runs, members);
         iterations.push_back({LargestChange(ShearsOf(made), now), runs.front().outcome});
         request.pushed = std::move(now);
+        if (request.pushed.empty()) break;
         if (iterations.size() > 1 && iterations.back().change.change < kSameShear) break;
         if (!Generate(request, made, refusal)) return 0;
     }
-    if (!(iterations.back().change.change < kSameShear))
+    if (request.pushed.empty())
+        made.warnings.push_back({"IDS_QM_GEN_WARN_NO_SHEAR", {}});
+    else if (!(iterations.back().change.change < kSameShear))
         made.warnings.push_back({"IDS_QM_GEN_WARN_NOT_SETTLED", {std::to_string(kMostPushes)}});
     if (!edit.Commit()) {
         refusal = RefusalOf(0, Say("IDS_QM_HINGE_NOT_STORED"));

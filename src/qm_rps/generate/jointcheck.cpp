@@ -2,7 +2,7 @@
 
 #include "qm_base/say.h"
 #include "qm_rps/codes/en1998shear.h"
-#include "qm_rps/generate/rchinge.h"
+#include "qm_rps/generate/rcend.h"
 #include "qm_rps/push/pushstoreys.h"
 
 #include <algorithm>

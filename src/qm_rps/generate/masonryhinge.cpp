@@ -1,7 +1,7 @@
 #include "qm_rps/generate/masonryhinge.h"
 
 #include "qm_rps/codes/masonrypier.h"
-#include "qm_rps/generate/rchinge.h"
+#include "qm_rps/generate/rcend.h"
 
 #include <algorithm>
 

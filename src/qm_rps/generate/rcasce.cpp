@@ -1,5 +1,3 @@
-#include "qm_rps/codes/asce41strength.h"
-#include "qm_rps/codes/concreteshear.h"
 #include "qm_rps/generate/rchinge.h"
 
 #include <algorithm>
@@ -19,18 +17,7 @@ std::optional<T_CODE_PLASTIC> AsceBeamEnd(const T_RC_BASIS& in, T_CODE_SIDE& sid
                                           CCodeSheet& sheet)
 {
     const T_RC_BENDING& s = in.section;
-    const std::optional<double> share = AsceTieShare(s.spacing, s.d, sheet);
-    if (!share) return {};
-    T_SHEAR_SECTION shear{s.b,
-                          s.d,
-                          s.area,
-                          in.material.fc,
-                          in.material.fyw,
-                          s.As / (s.b * s.d),
-                          0.0,
-                          s.shear * *share,
-                          s.spacing};
-    const std::optional<T_ACI_SHEAR> strength = AciShear(shear, 1.0, sheet);
+    const auto strength = AsceBeamShear(in, in.material, sheet);
     if (!strength) return {};
     side.shearStrength = strength->Vn;
     const T_SECT_DETAIL& detail = *in.end.section.detailing;
@@ -55,16 +42,7 @@ std::optional<T_CODE_PLASTIC> AsceColumnEnd(const T_RC_BASIS& in, T_CODE_SIDE& s
 {
     const T_RC_BENDING& s = in.section;
     const T_RC_MATERIAL& m = in.material;
-    T_ASCE_COLUMN_SHEAR shear;
-    shear.tieArea = s.shear;
-    shear.spacing = s.spacing;
-    shear.fyt = m.fyw;
-    shear.fc = m.fc;
-    shear.d = s.d;
-    shear.Ag = s.area;
-    shear.axial = in.axial;
-    shear.momentShear = in.end.ShearSpan();
-    const std::optional<T_ASCE_COLUMN_STRENGTH> strength = AsceColumnShear(shear, sheet);
+    const auto strength = AsceColumnShearOf(in, m, 0.0, sheet);
     if (!strength) return {};
     side.shearStrength = strength->initial;
     const T_SECT_DETAIL& detail = *in.end.section.detailing;
@@ -72,7 +50,7 @@ std::optional<T_CODE_PLASTIC> AsceColumnEnd(const T_RC_BASIS& in, T_CODE_SIDE& s
     column.circular = s.round && detail.hooks == STIRRUP_HOOKS::Hooks135;
     column.bw = s.b;
     column.d = s.d;
-    column.Ag = shear.Ag;
+    column.Ag = s.area;
     column.fc = m.fc;
     column.fyt = m.fyw;
     column.axial = in.axial;
@@ -86,7 +64,7 @@ std::optional<T_CODE_PLASTIC> AsceColumnEnd(const T_RC_BASIS& in, T_CODE_SIDE& s
                                                             : TIE_HOOKS::Other;
     column.tiesAnchored = detail.tiesInCore;
     column.poorSplice = detail.poorSplice;
-    column.longRatio = s.Bars() / shear.Ag;
+    column.longRatio = s.Bars() / s.area;
     column.fyl = m.fy;
     column.twoTiesInLap = detail.lapLength >= 2.0 * s.spacing;
     return AsceColumn(column, EditionOf(in.end), sheet);
@@ -131,7 +109,7 @@ bool WallShear(const T_RC_BASIS& in, const T_ASCE_WALL& wall, T_CODE_SIDE& side,
     T_ASCE_WALL_SHEAR moved = *drifts;
     for (double* drift : {&moved.g, &moved.d, &moved.e, &moved.IO, &moved.LS, &moved.CP})
         *drift *= in.end.clear;
-    side.shearBone = BackboneOfWallShear(moved, side.shearStrength, sheet);
+    side.shearBone = BackboneOfWallShear(moved, side.shearStrength, sheet, kDimLength);
     sheet.Warn("IDS_QM_GEN_WARN_CRACK", {CodeNumber(moved.f)});
     return side.shearBone.has_value();
 }

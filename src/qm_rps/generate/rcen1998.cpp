@@ -1,4 +1,3 @@
-#include "qm_rps/codes/concreteshear.h"
 #include "qm_rps/codes/confinement.h"
 #include "qm_rps/codes/en1998backbone.h"
 #include "qm_rps/codes/en1998shear.h"
@@ -12,78 +11,26 @@ namespace {
 
 constexpr auto K = CODE_MARK::Computed;
 
-/// Legs stand evenly spaced, each holds a bar.
-std::vector<double> Gaps(const T_RC_BENDING& s)
-{
-    std::vector<double> gaps;
-    for (const auto& [core, legs] : {std::pair(s.coreB, s.legs), std::pair(s.coreH, s.across)})
-        gaps.insert(gaps.end(), static_cast<std::size_t>(2 * (legs - 1)), core / (legs - 1));
-    return gaps;
-}
-
-/// A circle within hoops.
-std::optional<double> RoundEffectiveness(const T_RC_BENDING& s, bool hooked, CCodeSheet& sheet)
-{
-    const double arch = std::max(0.0, 1.0 - s.spacing / (2.0 * s.coreB));
-    return sheet.Put("alpha", hooked ? arch * arch : 0.0, "EN 1998-1 5.4.3.2.2(8)",
-                     "(1 - s/2 D0)^2; hooks not 135 degrees: 0", CODE_MARK::Recalled);
-}
-
-std::optional<T_EN_MEMBER> EnMember(const T_RC_BASIS& in, CCodeSheet& sheet)
-{
-    const T_RC_BENDING& s = in.section;
-    const T_SECT_DETAIL& detail = *in.end.section.detailing;
-    const bool hooked = detail.hooks == STIRRUP_HOOKS::Hooks135;
-    const std::optional<double> alpha =
-        s.round ? RoundEffectiveness(s, hooked, sheet)
-                : HoopEffectiveness({s.coreB, s.coreH, s.spacing, Gaps(s), hooked}, sheet);
-    if (!alpha) return {};
-    T_EN_MEMBER m;
-    m.b = s.b;
-    m.h = s.h;
-    m.d = s.d;
-    m.dPrime = s.dPrime;
-    m.fc = in.material.fc;
-    m.fy = in.material.fy;
-    m.fyw = in.material.fyw;
-    m.Es = in.material.Es;
-    m.Ec = in.material.Ec;
-    m.As = s.As;
-    m.AsPrime = s.AsPrime;
-    m.AsWeb = s.AsWeb;
-    m.barDiameter = s.barDiameter;
-    m.axial = in.axial;
-    m.shearSpan = in.end.ShearSpan();
-    m.alpha = *alpha;
-    m.hoopRatio = s.shear / (s.b * s.spacing);
-    m.wall = in.end.kind == MEMBER_KIND::Wall;
-    m.secondary = in.end.secondary;
-    m.seismicDetails = hooked;
-    m.lapRatio = detail.lapLength / s.barDiameter;
-    m.basis = in.end.code == HINGE_CODE::En1998 ? EN_BASIS::En1998 : EN_BASIS::Circolare2019;
-    return m;
-}
-
 /// Rotations of one side, and the depth of the compressed zone at yield.
-struct T_EN_ROTATIONS {
+struct T_SIDE_ROTATIONS {
     T_EN_HINGE hinge;
     double compressed = 0.0;
 };
 
-std::optional<T_EN_ROTATIONS> OfRectangle(const T_RC_BASIS& in, const T_EN_MEMBER& member,
-                                          double concreteShear, CCodeSheet& sheet)
+std::optional<T_SIDE_ROTATIONS> OfRectangle(const T_RC_BASIS& in, const T_EN_MEMBER& member,
+                                            double concreteShear, CCodeSheet& sheet)
 {
     T_EN_HINGE_IN hinge;
     hinge.member = member;
     hinge.concreteShear = concreteShear;
     std::optional<T_EN_HINGE> found = EnHinge(hinge, sheet);
     if (!found) return {};
-    return T_EN_ROTATIONS{*found, found->yield.xi * in.section.d};
+    return T_SIDE_ROTATIONS{*found, found->yield.xi * in.section.d};
 }
 
 /// (A.10) and (A.4) with the curvatures of the section.
-std::optional<T_EN_ROTATIONS> OfCircle(const T_RC_BASIS& in, const T_EN_MEMBER& m,
-                                       double concreteShear, double strength, CCodeSheet& sheet)
+std::optional<T_SIDE_ROTATIONS> OfCircle(const T_RC_BASIS& in, const T_EN_MEMBER& m,
+                                         double concreteShear, double strength, CCodeSheet& sheet)
 {
     const auto confined = Annex3Confined(m.alpha * m.hoopRatio * m.fyw, m.fc, sheet);
     if (!confined) return {};
@@ -108,7 +55,7 @@ std::optional<T_EN_ROTATIONS> OfCircle(const T_RC_BASIS& in, const T_EN_MEMBER& 
     curve.yieldDeform = *thetaY;
     const std::optional<T_CODE_BACKBONE> bone = BackboneOfChord(*limits, curve, sheet);
     if (!bone) return {};
-    T_EN_ROTATIONS r;
+    T_SIDE_ROTATIONS r;
     r.hinge.yield.curvature = curvatures->yield;
     r.hinge.yield.moment = strength;
     r.hinge.thetaY = *thetaY;
@@ -121,7 +68,7 @@ std::optional<T_EN_ROTATIONS> OfCircle(const T_RC_BASIS& in, const T_EN_MEMBER& 
 /// (A.12) at the ultimate rotation, not above the struts of EN 1992-1-1. A circle counts with the
 /// area of its core (A.3.3.1).
 std::optional<double> ShearStrength(const T_RC_BASIS& in, T_EN_MEMBER m,
-                                    const T_EN_ROTATIONS& rotations, double strut,
+                                    const T_SIDE_ROTATIONS& rotations, double strut,
                                     CCodeSheet& sheet)
 {
     const T_RC_BENDING& s = in.section;
@@ -149,11 +96,7 @@ std::optional<T_CODE_BACKBONE> EnBackbone(const T_RC_BASIS& in, T_CODE_SIDE& sid
     const T_RC_BENDING& s = in.section;
     const std::optional<T_EN_MEMBER> member = EnMember(in, sheet);
     if (!member) return {};
-    const double width = s.round ? s.area / s.d : s.b; // bw d is the area of a circle
-    const T_SHEAR_SECTION shear{width,      s.d,         s.area,
-                                member->fc, member->fyw, s.As / (width * s.d),
-                                in.axial,   s.shear,     s.spacing};
-    const std::optional<T_EN_SHEAR> monotonic = EnShear(shear, {1.0, 1.0, 1.0, false}, sheet);
+    const auto monotonic = EnMonotonicShear(in, in.material, sheet);
     if (!monotonic) return {};
     const auto found = s.round ? OfCircle(in, *member, monotonic->concrete, side.strength, sheet)
                                : OfRectangle(in, *member, monotonic->concrete, sheet);

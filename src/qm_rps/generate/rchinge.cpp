@@ -29,23 +29,6 @@ int Moment(const T_RC_BASIS& in, bool positive, double axial, double& moment, st
     return 0;
 }
 
-/// Geometry and strengths of one side on its sheet.
-int Prepare(const T_MEMBER_END& end, bool positive, CCodeSheet& sheet, T_RC_BASIS& basis,
-            std::string& reason)
-{
-    const auto section = RcBending(end.section, end.aboutY, positive, sheet);
-    const auto material = section ? RcMaterial(end.material, end.code, sheet) : std::nullopt;
-    if (!material || !sheet.Positive({{"clear length", end.clear}, {"EI", end.EI}})) {
-        reason = ReasonOf(sheet);
-        return 0;
-    }
-    basis.section = *section;
-    basis.material = *material;
-    basis.axial = sheet.Put("N", end.HasAxial() ? end.axial : 0.0, kDimForce, "",
-                            end.HasAxial() ? "initial loads" : "beam: 0", K);
-    return 1;
-}
-
 int Side(const T_RC_BASIS& basis, T_CODE_SIDE& side, CCodeSheet& sheet, std::string& reason)
 {
     sheet.Put("My", side.strength, kDimMoment, kBending, "plane sections, N", K);
@@ -70,11 +53,6 @@ int Side(const T_RC_BASIS& basis, T_CODE_SIDE& side, CCodeSheet& sheet, std::str
 
 } // namespace
 
-std::string ReasonOf(const CCodeSheet& sheet)
-{
-    return sheet.Fault() ? FaultText(*sheet.Fault()) : Say("IDS_QM_GEN_NO_ANSWER");
-}
-
 T_MATL_D AssessedMaterial(const T_MATL_D& material, const T_RC_MATERIAL& strengths)
 {
     T_MATL_D out = material;
@@ -87,18 +65,20 @@ int RcHinge(const T_MEMBER_END& end, T_SIDES<T_CODE_SIDE>& out, std::string& rea
 {
     T_SIDES<CCodeSheet> sheets;
     T_SIDES<T_CODE_SIDE> sides;
-    T_RC_BASIS pos{end, {}, {}}, neg{end, {}, {}};
-    if (!Prepare(end, true, sheets.pos, pos, reason) ||
-        !Prepare(end, false, sheets.neg, neg, reason))
+    const std::optional<T_RC_BASIS> pos = RcBasis(end, true, sheets.pos);
+    const std::optional<T_RC_BASIS> neg = pos ? RcBasis(end, false, sheets.neg) : std::nullopt;
+    if (!neg) {
+        reason = ReasonOf(pos ? sheets.neg : sheets.pos);
         return 0;
+    }
     for (const bool positive : {true, false}) {
         T_CODE_SIDE& side = positive ? sides.pos : sides.neg;
-        if (!Moment(pos, positive, pos.axial, side.strength, reason) ||
-            !Moment(pos, positive, 0.0, side.strengthAtZero, reason))
+        if (!Moment(*pos, positive, pos->axial, side.strength, reason) ||
+            !Moment(*pos, positive, 0.0, side.strengthAtZero, reason))
             return 0;
     }
     sides.pos.shear = sides.neg.shear = (sides.pos.strength + sides.neg.strength) / end.clear;
-    if (!Side(pos, sides.pos, sheets.pos, reason) || !Side(neg, sides.neg, sheets.neg, reason))
+    if (!Side(*pos, sides.pos, sheets.pos, reason) || !Side(*neg, sides.neg, sheets.neg, reason))
         return 0;
     out = std::move(sides);
     return 1;

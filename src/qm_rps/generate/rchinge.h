@@ -1,15 +1,7 @@
 // Both sides of the plastic hinge of a concrete member end: strength, shear and backbone by a code.
 #pragma once
 
-#include "qm_rps/generate/rcmember.h"
-
-/// What both sides share.
-struct T_RC_BASIS {
-    const T_MEMBER_END& end;
-    T_RC_BENDING section;
-    T_RC_MATERIAL material;
-    double axial = 0.0; // that counts
-};
+#include "qm_rps/generate/rcend.h"
 
 /// (+) compresses the side +z (about y) or +y, (-) the other. The strength is the bending capacity
 /// with the parabola-rectangle of EN 1992-1-1 for the strengths of RcMaterial; V = (M(+) + M(-)) /
@@ -22,9 +14,6 @@ struct T_RC_BASIS {
 /// The section's material with the assessed strengths in place of the characteristic ones, as the
 /// section calculator takes it.
 T_MATL_D AssessedMaterial(const T_MATL_D& material, const T_RC_MATERIAL& strengths);
-
-/// "spacing: must be above 0", or that the code gives no answer.
-std::string ReasonOf(const CCodeSheet& sheet);
 
 // ---- for the files of concrete alone ------------------------------------------------------------
 

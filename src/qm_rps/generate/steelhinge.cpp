@@ -5,7 +5,7 @@
 #include "qm_rps/codes/en1998steel.h"
 #include "qm_rps/codes/steelbuckling.h"
 #include "qm_rps/generate/axialcurve.h"
-#include "qm_rps/generate/rchinge.h"
+#include "qm_rps/generate/rcend.h"
 
 #include <algorithm>
 #include <cmath>
