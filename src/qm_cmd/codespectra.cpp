@@ -175,10 +175,14 @@ void CETC_GDS_USER::CalcCurrentPOSpectra()
         if (r.Sa[i] >= r.Sa[corner]) corner = i;
     }
     m_T = r.T;
-    m_A = m_V = r.Sa;
+    m_A = r.Sa;
+    for (double& Sa : m_A)
+        Sa *= m_factor;
+    m_V = m_A;
+    const double largest = r.Sa.empty() ? 0.0 : m_A[corner];
     for (std::size_t i = 0; i < r.T.size(); ++i) {
-        if (i > corner) m_A[i] = r.Sa[corner];
-        if (i < corner) m_V[i] = r.T[i] > 0.0 ? r.Sa[corner] * r.T[corner] / r.T[i] : 1e300;
+        if (i > corner) m_A[i] = largest;
+        if (i < corner) m_V[i] = r.T[i] > 0.0 ? largest * r.T[corner] / r.T[i] : 1e300;
     }
     m_shape.TC = r.T.empty() ? 0.0 : r.T[corner];
 }
@@ -186,10 +190,10 @@ void CETC_GDS_USER::CalcCurrentPOSpectra()
 double CETC_GDS_USER::CalcSaAt(double T) const
 {
     const auto& r = std::get<T_SPFC_USER>(m_record.data);
-    if (T <= r.T.front()) return r.Sa.front();
-    if (T >= r.T.back()) return r.Sa.back();
+    if (T <= r.T.front()) return m_factor * r.Sa.front();
+    if (T >= r.T.back()) return m_factor * r.Sa.back();
     const auto it = std::ranges::upper_bound(r.T, T);
     const auto i = static_cast<std::size_t>(it - r.T.begin());
     const double w = (T - r.T[i - 1]) / (r.T[i] - r.T[i - 1]);
-    return r.Sa[i - 1] + w * (r.Sa[i] - r.Sa[i - 1]);
+    return m_factor * (r.Sa[i - 1] + w * (r.Sa[i] - r.Sa[i - 1]));
 }

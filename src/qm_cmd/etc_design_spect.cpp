@@ -62,12 +62,14 @@ bool CETC_DESIGN_SPECT::HasFloors() const
 void CETC_DESIGN_SPECT::SetBranches(const T_SPECT_SHAPE& shape)
 {
     m_shape = shape;
-    m_T = CodeGrid(shape);
+    m_shape.a0 *= m_factor;
+    m_shape.plateau *= m_factor;
+    m_T = CodeGrid(m_shape);
     m_A.resize(m_T.size());
     m_V.resize(m_T.size());
     for (std::size_t i = 0; i < m_T.size(); ++i) {
-        m_A[i] = shape.AccelAt(m_T[i]);
-        m_V[i] = m_T[i] > 0.0 ? shape.VelocityAt(m_T[i]) : kFarLeft;
+        m_A[i] = m_shape.AccelAt(m_T[i]);
+        m_V[i] = m_T[i] > 0.0 ? m_shape.VelocityAt(m_T[i]) : kFarLeft;
     }
 }
 
@@ -103,11 +105,17 @@ int CETC_DESIGN_SPECT::CalcPOSpectrumByDamping(double betaPct, std::vector<doubl
         const T_SPECT_SHAPE shape = CalcShape(betaPct);
         T = m_T;
         Sa.resize(T.size());
-        std::ranges::transform(T, Sa.begin(), [&](double t) { return shape.SaAt(t); });
+        std::ranges::transform(T, Sa.begin(), [&](double t) { return m_factor * shape.SaAt(t); });
         return 1;
     }
     CalcPOSpectrumSRaSRv(f.SRa, f.SRv, T, Sa);
     return 1;
+}
+
+void CETC_DESIGN_SPECT::ScaleBy(double factor)
+{
+    m_factor = factor;
+    CalcCurrentPOSpectra();
 }
 
 double CETC_DESIGN_SPECT::CalcSaAt(double T) const

@@ -74,6 +74,9 @@ public:
     /// Gravity that the spectrum itself states, m/s2 in SI; absent for code spectra.
     virtual std::optional<double> GravitySi() const { return std::nullopt; }
 
+    /// Multiplies every ordinate of the record by a factor above 0; periods stay.
+    void ScaleBy(double factor);
+
     void SetCurrentDlg(int dlg) { m_currentDlg = dlg; }
     void SetShowMode(int mode) { m_showMode = mode; }
     int GetCurrentDlg() const { return m_currentDlg; }
@@ -89,10 +92,11 @@ protected:
     /// True where the lower bounds of SRA and SRV apply.
     bool HasFloors() const;
 
-    /// Fills grid and branches for a shape.
+    /// Fills grid and branches for a shape of the record, times the factor.
     void SetBranches(const T_SPECT_SHAPE& shape);
 
     T_SPFC_D m_record;
+    double m_factor = 1.0; // on the ordinates
     int m_behaviorType = 0;
     int m_limitState = 0;
     T_SPECT_SHAPE m_shape;

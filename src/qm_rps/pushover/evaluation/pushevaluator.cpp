@@ -194,6 +194,12 @@ void CPushEvaluator::GiveUp()
     ForgetSteps();
 }
 
+void CPushEvaluator::SetSpectrumFactor(double factor)
+{
+    m_spectrumFactor = factor;
+    m_spectrumMade.reset();
+}
+
 // The spectrum of the record at its own damping; NTC gives the state SLV here.
 void CPushEvaluator::PrepareSpectrum()
 {
@@ -206,6 +212,7 @@ void CPushEvaluator::PrepareSpectrum()
         return;
     auto spectrum = MakeDesignSpectrum(m_spectrumRecord, behavior, LIMIT_STATE::SLV);
     if (spectrum) {
+        if (m_spectrumFactor != 1.0) spectrum->ScaleBy(m_spectrumFactor);
         spectrum->SetCurrentDlg(static_cast<int>(m_eval.method));
         spectrum->SetShowMode(static_cast<int>(m_spectrumShow));
     }
@@ -250,7 +257,8 @@ T_TARGET_INPUT CPushEvaluator::TargetInput(CStepDrift& drift) const
     in.drift = [&drift, &steps = m_curve.Steps()](int index) {
         return drift.Of(steps[static_cast<std::size_t>(index)]);
     };
-    in.spectra = TargetSpectraOf(m_spectrumRecord, m_eval.method, Damping().behaviorType);
+    in.spectra =
+        TargetSpectraOf(m_spectrumRecord, m_eval.method, Damping().behaviorType, m_spectrumFactor);
     return in;
 }
 

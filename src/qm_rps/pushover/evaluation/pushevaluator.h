@@ -44,6 +44,8 @@ public:
 
     /// Whether limit-state steps are stored in the model (the default).
     void SetStoreSteps(bool store) { m_storeSteps = store; }
+    /// Multiplies the ordinates of the demand spectra; above 0, 1 is the default.
+    void SetSpectrumFactor(double factor);
     /// How the demand spectrum shows itself; Displacement is the default.
     void SetSpectrumShow(SPECTRUM_SHOW over) { m_spectrumShow = over; }
     /// Whether every point where demand equals capacity is looked for (the default).
@@ -111,6 +113,7 @@ private:
     std::optional<T_SPFC_D> m_spectrumMade;
     int m_spectrumBehavior = -1;
     double m_spectrumGravity = 0.0;
+    double m_spectrumFactor = 1.0;
     SPECTRUM_SHOW m_spectrumShow = SPECTRUM_SHOW::Displacement;
     T_PUSH_EVALUATION m_result;
 };

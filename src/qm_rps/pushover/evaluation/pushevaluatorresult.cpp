@@ -103,6 +103,7 @@ void CPushEvaluator::KeepStateDemands()
         const auto spectrum = MakeDesignSpectrum(m_spectrumRecord, Damping().behaviorType,
                                                  static_cast<LIMIT_STATE>(i));
         if (!spectrum) continue;
+        if (m_spectrumFactor != 1.0) spectrum->ScaleBy(m_spectrumFactor);
         T_ADRS_CURVE& curve = m_result.stateDemands[i];
         spectrum->CalcPOSpectrumSRaSRv(1.0, 1.0, T, curve.Sa);
         ToAdrs(T, curve.Sa, curve.Sd);

@@ -20,7 +20,7 @@ T_BILINEAR_OPTIONS BilinearOptionsOf(const T_EVAL_D& evaluation)
 }
 
 std::array<T_TARGET_SPECTRUM, 4> TargetSpectraOf(const T_SPFC_D& record, PUSH_METHOD method,
-                                                 int behaviorType)
+                                                 int behaviorType, double factor)
 {
     std::array<T_TARGET_SPECTRUM, 4> spectra;
     const bool ntc = method != PUSH_METHOD::Ec8Opcm;
@@ -29,6 +29,7 @@ std::array<T_TARGET_SPECTRUM, 4> TargetSpectraOf(const T_SPFC_D& record, PUSH_ME
         const std::shared_ptr<CETC_DESIGN_SPECT> spectrum =
             MakeDesignSpectrum(record, behaviorType, state);
         if (!spectrum) continue;
+        if (factor != 1.0) spectrum->ScaleBy(factor);
         spectra[i] = {[spectrum](double T) { return spectrum->CalcSaAt(T); },
                       spectrum->CornerPeriod()};
     }

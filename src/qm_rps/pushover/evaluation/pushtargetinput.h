@@ -9,9 +9,9 @@
 T_BILINEAR_OPTIONS BilinearOptionsOf(const T_EVAL_D& evaluation);
 
 /// The elastic spectra of the limit states: NTC has four, Eurocode 8 one. A state that the record
-/// does not enable stays empty.
+/// does not enable stays empty. `factor` on their ordinates.
 std::array<T_TARGET_SPECTRUM, 4> TargetSpectraOf(const T_SPFC_D& spectrum, PUSH_METHOD method,
-                                                 int behaviorType);
+                                                 int behaviorType, double factor = 1.0);
 
 /// Storey drift ratios of the steps of a load case, by the chosen kind; remembers what it met.
 class CStepDrift {
