@@ -81,16 +81,40 @@ struct T_WANTED {
     int turn = 0;
     std::vector<T_PUSH_POINT> points;
     T_WAY way;
+    std::vector<double> path{}; // further displacements
 };
 
 /// Displacements that the engine can be asked for, no further than the stored pushes have come.
 std::vector<double> StepsAt(const T_POLC_D& record, const std::vector<T_WANTED>& wanted)
 {
     std::vector<double> out;
-    for (const T_WANTED& one : wanted)
+    for (const T_WANTED& one : wanted) {
+        const auto add = [&](double d) {
+            if (one.way.Reaches(d) && IsOnTheWay(record, d)) out.push_back(d);
+        };
         for (const T_PUSH_POINT& point : one.points)
-            if (one.way.Reaches(point.displacement) && IsOnTheWay(record, point.displacement))
-                out.push_back(point.displacement);
+            add(point.displacement);
+        for (const double d : one.path)
+            add(d);
+    }
+    return out;
+}
+
+/// Displacements at the vertices of a stored push and right behind its start. Vertices at one place
+/// (a drop of strength) have one.
+std::vector<double> PathOf(IPushRun& run, const T_WAY& way)
+{
+    constexpr double kNear = 1e-5, kSame = 1e-9; // of the reach
+    std::vector<double> out{way.At(kNear * way.reach), way.At(2.0 * kNear * way.reach)};
+    std::vector<T_RUN_EVENT> events;
+    if (!run.ReadEvents(events)) return out;
+    const int last = events.empty() ? 0 : events.back().stage;
+    for (const T_RUN_EVENT& event : events) {
+        const double d = event.displacement;
+        const bool isBehind = way.sign * (d - out[1]) > kSame * way.reach;
+        if (event.stage == last && isBehind && std::fabs(d - out.back()) > kSame * way.reach)
+            out.push_back(d);
+    }
     return out;
 }
 
@@ -194,7 +218,8 @@ std::vector<T_HINGES_AT> HingesOfEvaluations(CDBDoc& doc,
 }
 
 T_HINGES_AT PushToEvaluation(CDBDoc& doc, const T_PUSH_EVALUATION& result,
-                             const PUSH_PROGRESS_FN& progress, T_PUSH_RUN& run)
+                             const PUSH_PROGRESS_FN& progress, T_PUSH_RUN& run,
+                             const PUSH_FORCES_FN& forces)
 {
     T_HINGES_AT out;
     int key = 0;
@@ -202,6 +227,12 @@ T_HINGES_AT PushToEvaluation(CDBDoc& doc, const T_PUSH_EVALUATION& result,
     run = {};
     if (wanted.points.empty()) return out;
     CPushRun push(doc);
+    if (forces) {
+        wanted.path = PathOf(*doc.Post().RunOf(key, wanted.turn), wanted.way);
+        push.TellForces([&forces, turn = wanted.turn](const T_STEP_FORCES& step) {
+            if (step.run.turn == turn) forces(step);
+        });
+    }
     run = PushToPoints(push, key, doc.Data().Model().pushovers.at(key), {std::move(wanted)},
                        progress);
     return out;

@@ -144,9 +144,11 @@ int CPushRun::RunCase(T_PREPARED& on, const T_PUSH_CASE& c, const PUSH_PROGRESS_
                       T_PUSH_RUN& out, std::string& error)
 {
     CPushCollector collector(m_model, m_frame, on.hinges, c);
+    std::vector<solver::T_PUSH_STEP> steps; // of the case, where their forces are told
     solver::T_PUSH_SINK sink;
     sink.step = [&](const solver::T_PUSH_STEP& step) {
         if (!collector.Take(step)) return true;
+        if (m_forces) steps.push_back(step);
         const T_PUSH_RUN& so = collector.SoFar();
         return !progress || progress({c.name, so.loadFactor.size(), c.stages.back().steps.size(),
                                       so.displacement.back(), so.baseReaction.back(),
@@ -161,6 +163,21 @@ int CPushRun::RunCase(T_PREPARED& on, const T_PUSH_CASE& c, const PUSH_PROGRESS_
         return 0;
     }
     out = collector.Finish(end);
+    return TellSteps(on, out, steps, error);
+}
+
+int CPushRun::TellSteps(T_PREPARED& on, const T_PUSH_RUN& run,
+                        const std::vector<solver::T_PUSH_STEP>& steps, std::string& error)
+{
+    for (std::size_t i = 0; i < steps.size(); ++i) {
+        solver::T_RESULT result;
+        solver::T_SOLVER_ERROR fault;
+        if (!on.solver.Forces(steps[i], result, fault)) {
+            error = Words(fault);
+            return 0;
+        }
+        m_forces({run, i, m_frame.ElementIds(), result});
+    }
     return 1;
 }
 

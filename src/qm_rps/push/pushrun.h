@@ -61,6 +61,15 @@ struct T_PUSH_PROGRESS {
     double displacement = 0.0, baseReaction = 0.0;
     double startDisplacement = 0.0, startReaction = 0.0; // before the first step
 };
+/// The member forces of a step, told once its load case has been pushed.
+struct T_STEP_FORCES {
+    const T_PUSH_RUN& run;
+    std::size_t step = 0;             // index of the run's steps
+    const std::vector<int>& elements; // ids by the index of `result`
+    const solver::T_RESULT& result;
+};
+using PUSH_FORCES_FN = std::function<void(const T_STEP_FORCES&)>;
+
 /// Told after each step; false: no further one is wanted.
 using PUSH_PROGRESS_FN = std::function<bool(const T_PUSH_PROGRESS&)>;
 
@@ -79,6 +88,9 @@ public:
     /// those of the record; evaluations do not read them. Between the axes they are left out.
     [[nodiscard]] int Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_RUN>& out,
                           std::string& error, const std::vector<double>& extra = {});
+
+    /// Runs from now on tell the member forces of their steps, in order, step after step.
+    void TellForces(PUSH_FORCES_FN tell) { m_forces = std::move(tell); }
 
     /// The results of a load case that the document has, as Run gives them: states and storey
     /// values are made again from the stored steps. 1 done; 0 `error` says why not (there are none
@@ -105,6 +117,8 @@ private:
                                           std::string& error);
     int RunCase(T_PREPARED& on, const T_PUSH_CASE& c, const PUSH_PROGRESS_FN& progress,
                 T_PUSH_RUN& out, std::string& error);
+    int TellSteps(T_PREPARED& on, const T_PUSH_RUN& run,
+                  const std::vector<solver::T_PUSH_STEP>& steps, std::string& error);
     std::string Words(const solver::T_SOLVER_ERROR& error) const;
 
     CDBDoc& m_doc;
@@ -112,4 +126,5 @@ private:
     CAnalysisModel m_frame;
     bool m_hasFrame = false;
     std::vector<std::unique_ptr<T_PREPARED>> m_prepared;
+    PUSH_FORCES_FN m_forces;
 };
