@@ -100,20 +100,31 @@ std::vector<double> StepsAt(const T_POLC_D& record, const std::vector<T_WANTED>&
     return out;
 }
 
-/// Displacements at the vertices of a stored push and right behind its start. Vertices at one place
-/// (a drop of strength) have one.
+/// A hinge has come to the end of its rise: strength may drop there.
+bool MayDrop(const T_RUN_EVENT& event)
+{
+    return std::ranges::any_of(event.turns, [](const T_RUN_TURN& turn) {
+        return turn.turn == solver::HINGE_TURN::Point && turn.point > 1;
+    });
+}
+
+/// Displacements at the vertices of a stored push and right behind its start. At a drop of strength
+/// the step is the state after it: one right before it is the state that it starts from.
 std::vector<double> PathOf(IPushRun& run, const T_WAY& way)
 {
-    constexpr double kNear = 1e-5, kSame = 1e-9; // of the reach
+    constexpr double kNear = 1e-5, kBefore = 1e-6, kSame = 1e-9; // of the reach
     std::vector<double> out{way.At(kNear * way.reach), way.At(2.0 * kNear * way.reach)};
     std::vector<T_RUN_EVENT> events;
     if (!run.ReadEvents(events)) return out;
     const int last = events.empty() ? 0 : events.back().stage;
-    for (const T_RUN_EVENT& event : events) {
-        const double d = event.displacement;
+    const auto add = [&](double d) {
         const bool isBehind = way.sign * (d - out[1]) > kSame * way.reach;
-        if (event.stage == last && isBehind && std::fabs(d - out.back()) > kSame * way.reach)
-            out.push_back(d);
+        if (isBehind && std::fabs(d - out.back()) > kSame * way.reach) out.push_back(d);
+    };
+    for (const T_RUN_EVENT& event : events) {
+        if (event.stage != last) continue;
+        if (MayDrop(event)) add(event.displacement - way.sign * kBefore * way.reach);
+        add(event.displacement);
     }
     return out;
 }
