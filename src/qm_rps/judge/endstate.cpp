@@ -1,0 +1,149 @@
+#include "qm_rps/judge/endstate.h"
+
+#include <algorithm>
+#include <cmath>
+#include <numeric>
+
+namespace {
+
+using T_VECTOR = std::array<double, 3>;
+
+double Dot(const T_VECTOR& a, const T_VECTOR& b)
+{
+    return std::inner_product(a.begin(), a.end(), b.begin(), 0.0);
+}
+
+T_VECTOR Cross(const T_VECTOR& a, const T_VECTOR& b)
+{
+    return {a[1] * b[2] - a[2] * b[1], a[2] * b[0] - a[0] * b[2], a[0] * b[1] - a[1] * b[0]};
+}
+
+T_VECTOR Plus(const T_VECTOR& a, const T_VECTOR& b, double factor)
+{
+    return {a[0] + factor * b[0], a[1] + factor * b[1], a[2] + factor * b[2]};
+}
+
+/// Length; the vector becomes a unit vector. 0: it is none.
+double Normalise(T_VECTOR& v)
+{
+    const double size = std::sqrt(Dot(v, v));
+    if (size > 0.0)
+        for (double& c : v)
+            c /= size;
+    return size;
+}
+
+/// Displacement and rotation of a node in a step; nodes without any are at rest.
+T_DOF6 MoveOf(const T_RUN_DATA& data, std::size_t step, int node)
+{
+    const auto at = std::ranges::lower_bound(data.nodes, node);
+    if (at == data.nodes.end() || *at != node) return {};
+    return data.displacement[step][static_cast<std::size_t>(at - data.nodes.begin())];
+}
+
+/// The end of the flexible part moves with its node, rigidly.
+T_VECTOR EndMove(const T_DOF6& node, const T_VECTOR& offset)
+{
+    return Plus({node[0], node[1], node[2]}, Cross({node[3], node[4], node[5]}, offset), 1.0);
+}
+
+double ChordRotation(const T_END_PLACE& place, const T_MEMBER_AXES& axes, const T_RUN_DATA& data,
+                     std::size_t step)
+{
+    const T_DOF6 i = MoveOf(data, step, axes.nodeI), j = MoveOf(data, step, axes.nodeJ);
+    const T_VECTOR moved = Plus(EndMove(j, axes.offsetJ), EndMove(i, axes.offsetI), -1.0);
+    const T_DOF6& own = place.atJ ? j : i;
+    const T_VECTOR turn{own[3], own[4], own[5]};
+    // A right-hand turn about y moves +x towards -z, one about z towards +y.
+    if (place.component == HINGE_COMPONENT::My)
+        return Dot(turn, axes.y) + Dot(moved, axes.z) / axes.length;
+    return Dot(turn, axes.z) - Dot(moved, axes.y) / axes.length;
+}
+
+} // namespace
+
+std::optional<T_MEMBER_AXES> AxesOf(const T_MODEL& model, const T_ELEM_D& e)
+{
+    constexpr double kVertical = 1e-6;
+    T_MEMBER_AXES axes;
+    axes.nodeI = e.nodeI;
+    axes.nodeJ = e.nodeJ;
+    axes.offsetI = e.offset.I;
+    axes.offsetJ = e.offset.J;
+    axes.x = Plus(Plus(model.nodes.at(e.nodeJ).xyz, e.offset.J, 1.0),
+                  Plus(model.nodes.at(e.nodeI).xyz, e.offset.I, 1.0), -1.0);
+    axes.length = Normalise(axes.x);
+    if (!(axes.length > 0.0)) return {};
+    T_VECTOR reference = e.zAxis;
+    if (reference == T_VECTOR{})
+        reference = std::hypot(axes.x[0], axes.x[1]) < kVertical ? T_VECTOR{1.0, 0.0, 0.0}
+                                                                 : T_VECTOR{0.0, 0.0, 1.0};
+    axes.z = Plus(reference, axes.x, -Dot(reference, axes.x));
+    if (!(Normalise(axes.z) > 0.0)) return {};
+    axes.y = Cross(axes.z, axes.x);
+    return axes;
+}
+
+T_END_STATE Between(const T_END_STATE& a, const T_END_STATE& b, double at)
+{
+    T_END_STATE s;
+    for (double T_END_STATE::*m :
+         {&T_END_STATE::N, &T_END_STATE::M, &T_END_STATE::V, &T_END_STATE::chord,
+          &T_END_STATE::flowed, &T_END_STATE::hingeMoment})
+        s.*m = a.*m + at * (b.*m - a.*m);
+    return s;
+}
+
+T_END_STATE EndState(const T_END_PLACE& place, const T_MEMBER_AXES& axes, long hinge,
+                     const T_STEP_FORCES& step)
+{
+    T_END_STATE s;
+    const auto at = std::ranges::lower_bound(step.elements, place.element);
+    const auto& forces = step.result.force[static_cast<std::size_t>(at - step.elements.begin())];
+    const solver::T_VEC6& end = place.atJ ? forces.back() : forces.front();
+    const bool aboutY = place.component == HINGE_COMPONENT::My;
+    s.N = -end[0];
+    s.M = end[aboutY ? 4 : 5];
+    s.V = end[aboutY ? 2 : 1];
+    s.chord = ChordRotation(place, axes, step.run.data, step.step);
+    if (hinge < 0) return s;
+    const T_PUSH_HINGE_SERIES& series = step.run.hinges[static_cast<std::size_t>(hinge)];
+    s.flowed = series.deformation[step.step];
+    s.hingeMoment = series.force[step.step];
+    return s;
+}
+
+void PutStart(double displacement, T_JUDGED_PATH& path)
+{
+    constexpr double kNear = 2.1e-5; // of the way: no vertex is looked for there
+    if (path.ends.size() < 2) return;
+    const double first = path.displacement[0], second = path.displacement[1];
+    const double way = std::fabs(path.displacement.back() - displacement);
+    if (first == displacement || second == first || std::fabs(second - displacement) > kNear * way)
+        return;
+    const double at = (displacement - first) / (second - first); // below 0
+    std::vector<T_END_STATE> start;
+    for (std::size_t e = 0; e < path.ends[0].size(); ++e)
+        start.push_back(Between(path.ends[0][e], path.ends[1][e], at));
+    path.baseReaction.insert(path.baseReaction.begin(),
+                             path.baseReaction[0] +
+                                 at * (path.baseReaction[1] - path.baseReaction[0]));
+    path.displacement.insert(path.displacement.begin(), displacement);
+    path.ends.insert(path.ends.begin(), std::move(start));
+    path.hasStart = true;
+}
+
+std::size_t LargestShearAt(const T_JUDGED_PATH& path)
+{
+    constexpr double kSame = 1e-9; // of the largest: a level branch has its first state
+    if (path.displacement.empty()) return 0;
+    // Reaction and displacement have one sign while the push goes on; what unloads first counts.
+    const double way = path.displacement.back() < path.displacement.front() ? -1.0 : 1.0;
+    double largest = 0.0;
+    for (const double v : path.baseReaction)
+        largest = std::max(largest, way * v);
+    const auto at = std::ranges::find_if(
+        path.baseReaction, [&](double v) { return way * v >= largest * (1.0 - kSame); });
+    return at == path.baseReaction.end() ? 0
+                                         : static_cast<std::size_t>(at - path.baseReaction.begin());
+}

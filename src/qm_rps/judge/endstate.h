@@ -1,0 +1,51 @@
+// Forces and rotations of member ends in the steps of a push. SI.
+#pragma once
+
+#include "qm_rps/push/pushrun.h"
+
+/// A beam element: flexible length between its rigid offsets, local axes.
+struct T_MEMBER_AXES {
+    int nodeI = 0, nodeJ = 0; // ids
+    std::array<double, 3> offsetI{}, offsetJ{};
+    std::array<double, 3> x{}, y{}, z{};
+    double length = 0.0;
+};
+/// Nothing where the offsets leave no length.
+std::optional<T_MEMBER_AXES> AxesOf(const T_MODEL& model, const T_ELEM_D& element);
+
+/// Which end of which element, bent about which of its axes.
+struct T_END_PLACE {
+    int element = 0;
+    bool atJ = false;
+    HINGE_COMPONENT component = HINGE_COMPONENT::My; // or Mz
+    bool operator==(const T_END_PLACE&) const = default;
+};
+
+/// Forces with the signs of an analysis but for the axial force.
+struct T_END_STATE {
+    double N = 0.0; // compression positive
+    double M = 0.0, V = 0.0;
+    double chord = 0.0;  // rotation of the end, that of its hinge included, less that of the chord
+    double flowed = 0.0; // deformation of the hinge at the end, 0 without one
+    double hingeMoment = 0.0;
+};
+/// On the straight line from a (0) to b (1); beyond them too.
+T_END_STATE Between(const T_END_STATE& a, const T_END_STATE& b, double at);
+
+/// The state of an end in a step. `hinge`: its component among those of the run; -1: none.
+T_END_STATE EndState(const T_END_PLACE& place, const T_MEMBER_AXES& axes, long hinge,
+                     const T_STEP_FORCES& step);
+
+/// A path of states: straight from each to the next one. Index 0 is the state before the first
+/// step, where it is known.
+struct T_JUDGED_PATH {
+    bool hasStart = false;
+    std::vector<double> displacement, baseReaction; // of the control, totals
+    std::vector<std::vector<T_END_STATE>> ends;     // by state and end
+};
+/// Puts what stood before the first step in front: on the line through the first two states, where
+/// these are steps right behind the start (PushToEvaluation); else the path stays without a start.
+void PutStart(double displacement, T_JUDGED_PATH& path);
+/// Index of the first state with the largest base reaction, by its magnitude in the direction of
+/// the push.
+std::size_t LargestShearAt(const T_JUDGED_PATH& path);

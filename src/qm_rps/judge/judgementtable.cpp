@@ -1,0 +1,206 @@
+#include "qm_rps/judge/judgementtable.h"
+
+#include "qm_base/say.h"
+#include "qm_rps/generate/codehingerows.h"
+#include "qm_rps/push/pushatpointtext.h"
+
+#include <algorithm>
+#include <set>
+
+namespace {
+
+/// How a column is measured, and what it is called.
+struct T_COLUMN {
+    JUDGED_COLUMN column;
+    const char* key;
+    const char* symbol; // instead of a text of the catalogue
+    T_DIM dim;
+    bool isAngle = false;
+};
+using C = JUDGED_COLUMN;
+constexpr std::array<T_COLUMN, kJudgedColumns> kColumns{{
+    {C::State, "IDS_QM_JUDGE_LIMIT_STATE", "", {}},
+    {C::Element, "IDS_QM_CLI_ELEMENT", "", {}},
+    {C::End, "IDS_QM_GEN_END", "", {}},
+    {C::Axis, "IDS_QM_GEN_AXIS", "", {}},
+    {C::Storey, "IDS_QM_JUDGE_STOREY", "", {}},
+    {C::Code, "IDS_QM_JUDGE_BY", "", {}},
+    {C::N, "", "N", kDimForce},
+    {C::M, "", "M", kDimMoment},
+    {C::V, "", "V", kDimForce},
+    {C::Span, "", "LV", kDimLength},
+    {C::ThetaY, "", "theta_y", {}, true},
+    {C::Theta, "", "theta", {}, true},
+    {C::ThetaCapacity, "IDS_QM_JUDGE_THETA_CAPACITY", "", {}, true},
+    {C::ThetaRatio, "IDS_QM_JUDGE_THETA_RATIO", "", {}},
+    {C::Shear, "IDS_QM_JUDGE_SHEAR_DEMAND", "", kDimForce},
+    {C::ShearCapacity, "", "VR", kDimForce},
+    {C::ShearRatio, "IDS_QM_JUDGE_SHEAR_RATIO", "", {}},
+    {C::Governing, "IDS_QM_JUDGE_GOVERNING", "", {}},
+    {C::Clause, "IDS_QM_JUDGE_CLAUSE", "", {}},
+    {C::Verdict, "IDS_QM_JUDGE_VERDICT", "", {}},
+    {C::Figures, "IDS_QM_JUDGE_FIGURES", "", {}},
+    {C::Reason, "IDS_QM_JUDGE_REASON", "", {}},
+}};
+
+/// The cells of a row, by their columns.
+class CCells {
+public:
+    explicit CCells(const T_UNITS& units) : m_units(units) {}
+    void Text(JUDGED_COLUMN column, std::string text)
+    {
+        cells[static_cast<std::size_t>(column)].text = std::move(text);
+    }
+    void Number(JUDGED_COLUMN column, std::optional<double> si)
+    {
+        const auto at = static_cast<std::size_t>(column);
+        if (si) cells[at].number = FromSi(*si, m_units, kColumns[at].dim) + 0.0;
+    }
+    T_JUDGED_CELLS cells;
+
+private:
+    T_UNITS m_units;
+};
+
+void PutCheck(const std::optional<T_CHECK>& check, C demand, C capacity, C ratio, CCells& to)
+{
+    if (!check) return;
+    to.Number(demand, check->demand);
+    to.Number(capacity, check->capacity);
+    to.Number(ratio, check->Ratio());
+}
+
+/// Why a check of the row is missing; both alike: once.
+std::string ReasonOf(const T_END_CHECKS& checks)
+{
+    std::string text;
+    for (const JUDGE_MODE mode : {JUDGE_MODE::Rotation, JUDGE_MODE::Shear}) {
+        const std::string& why =
+            mode == JUDGE_MODE::Rotation ? checks.whyNoRotation : checks.whyNoShear;
+        if (why.empty() || (mode == JUDGE_MODE::Shear && why == checks.whyNoRotation)) continue;
+        text += (text.empty() ? "" : "; ") + ModeText(mode) + ": " + why;
+    }
+    return text;
+}
+
+std::optional<double> Known(double value)
+{
+    return value > 0.0 ? std::optional(value) : std::nullopt;
+}
+
+} // namespace
+
+std::string VerdictText(VERDICT verdict)
+{
+    constexpr std::array<const char*, 3> kKeys{
+        "IDS_QM_JUDGE_FULFILLED", "IDS_QM_JUDGE_NOT_FULFILLED", "IDS_QM_JUDGE_NOT_CHECKED"};
+    return Say(kKeys[static_cast<std::size_t>(verdict)]);
+}
+
+std::string VerdictCountText(const T_VERDICT_COUNT& count)
+{
+    std::string text;
+    for (std::size_t v = 0; v < count.count.size(); ++v)
+        text += (v == 0 ? "" : ", ") + VerdictText(static_cast<VERDICT>(v)) + " " +
+                std::to_string(count.count[v]);
+    return text;
+}
+
+std::string ModeText(JUDGE_MODE mode)
+{
+    return Say(mode == JUDGE_MODE::Rotation ? "IDS_QM_JUDGE_ROTATION" : "IDS_QM_JUDGE_SHEAR");
+}
+
+std::string EndText(const T_JUDGED_END& end)
+{
+    return std::to_string(end.place.element) + (end.place.atJ ? " J " : " I ") +
+           kComponentNames[static_cast<std::size_t>(end.place.component)];
+}
+
+std::string StateText(const T_JUDGEMENT& judgement, const T_JUDGED_STATE& state)
+{
+    for (const T_JUDGED_END& end : judgement.ends) {
+        if (end.basis == JUDGE_BASIS::Nothing) continue;
+        const std::string own = end.Levels()[state.level];
+        return own == state.name ? state.name : state.name + " (" + own + ")";
+    }
+    return state.name;
+}
+
+std::string StateAtText(const T_JUDGEMENT& judgement, const T_JUDGED_STATE& state)
+{
+    const std::string name = StateText(judgement, state);
+    T_PUSH_POINT point = state.point;
+    if (point.kind == PUSH_POINT::Performance) return name + ", " + PointName(point);
+    point.state = name;
+    return PointName(point);
+}
+
+T_JUDGED_CELLS CellsOf(const T_JUDGEMENT& judgement, const T_JUDGED_STATE& state,
+                       const T_JUDGED_ROW& row)
+{
+    const T_JUDGED_END& end = judgement.ends[row.end];
+    CCells to(judgement.units);
+    to.Text(C::State, StateText(judgement, state));
+    to.cells[static_cast<std::size_t>(C::Element)].number = end.place.element;
+    to.Text(C::End, end.place.atJ ? "J" : "I");
+    to.Text(C::Axis, kComponentNames[static_cast<std::size_t>(end.place.component)]);
+    to.Text(C::Storey, end.storey);
+    to.Text(C::Code, end.Code());
+    to.Number(C::N, row.state.N);
+    to.Number(C::M, row.state.M);
+    to.Number(C::V, row.state.V);
+    to.Number(C::Span, Known(row.checks.LV));
+    to.Number(C::ThetaY, Known(row.checks.thetaY));
+    PutCheck(row.checks.rotation[state.level], C::Theta, C::ThetaCapacity, C::ThetaRatio, to);
+    PutCheck(row.checks.shear[state.level], C::Shear, C::ShearCapacity, C::ShearRatio, to);
+    const bool any = row.checks.rotation[state.level] || row.checks.shear[state.level];
+    if (any) {
+        to.Text(C::Governing, ModeText(row.governing));
+        to.Text(C::Clause, ClauseOf(end, row, row.governing, state.level));
+    }
+    to.Text(C::Verdict, VerdictText(row.verdict));
+    if (end.basis == JUDGE_BASIS::Code && any)
+        to.Text(C::Figures, MarkText(std::max(LeastSureOf(row.checks.rotationTrace),
+                                              LeastSureOf(row.checks.shearTrace))));
+    to.Text(C::Reason, ReasonOf(row.checks));
+    return to.cells;
+}
+
+std::array<std::string, kJudgedColumns> JudgedHeads(const T_UNITS& units)
+{
+    std::array<std::string, kJudgedColumns> heads;
+    for (const T_COLUMN& column : kColumns) {
+        std::string& head = heads[static_cast<std::size_t>(column.column)];
+        head = column.key[0] ? Say(column.key) : column.symbol;
+        const std::string unit = column.isAngle ? "rad" : UnitText(column.dim, units);
+        if (!unit.empty()) head += " (" + unit + ")";
+    }
+    return heads;
+}
+
+std::vector<std::string> JudgementNotes(const T_JUDGEMENT& judgement)
+{
+    std::vector<std::string> notes;
+    std::set<std::string> told;
+    const auto add = [&](const std::string& note) {
+        if (std::ranges::find(notes, note) == notes.end()) notes.push_back(note);
+    };
+    if (judgement.LeastSure() != CODE_MARK::Computed) add(Say("IDS_QM_JUDGE_UNSURE"));
+    add(Say("IDS_QM_JUDGE_JOINTS"));
+    if (std::ranges::any_of(judgement.ends, [](const T_JUDGED_END& end) {
+            return end.basis == JUDGE_BASIS::Code && !IsChordCode(end.member.code) &&
+                   !end.member.material.knowledge;
+        }))
+        add(Say("IDS_QM_JUDGE_NO_KNOWLEDGE"));
+    for (const T_JUDGED_STATE& state : judgement.states)
+        for (const T_JUDGED_ROW& row : state.rows)
+            for (const T_CODE_WARNING& warning : row.checks.warnings) {
+                // One that differs by its numbers alone stands once.
+                std::string subject = warning.key;
+                for (std::size_t i = 0; i < std::min<std::size_t>(2, warning.places.size()); ++i)
+                    subject += '|' + warning.places[i];
+                if (told.insert(subject).second) add(WarningText(warning));
+            }
+    return notes;
+}

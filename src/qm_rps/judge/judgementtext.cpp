@@ -1,0 +1,209 @@
+#include "qm_rps/judge/judgementtext.h"
+
+#include "qm_base/say.h"
+#include "qm_base/textformat.h"
+#include "qm_rps/generate/codehingerows.h"
+#include "qm_rps/push/pushatpointtext.h"
+
+#include <algorithm>
+
+namespace {
+
+using T_LINES = std::vector<std::vector<std::string>>;
+
+/// Letters, of which some have two bytes.
+std::size_t Letters(const std::string& text)
+{
+    return static_cast<std::size_t>(std::ranges::count_if(
+        text, [](char c) { return (static_cast<unsigned char>(c) & 0xC0U) != 0x80U; }));
+}
+
+/// Columns under their heads, to the right but for the last one.
+std::string Table(const T_LINES& lines)
+{
+    std::vector<std::size_t> width(lines.front().size());
+    for (const auto& line : lines)
+        for (std::size_t c = 0; c < line.size(); ++c)
+            width[c] = std::max(width[c], Letters(line[c]));
+    std::string text;
+    for (const auto& line : lines) {
+        std::string row = " ";
+        for (std::size_t c = 0; c < line.size(); ++c) {
+            const std::string gap(width[c] - Letters(line[c]), ' ');
+            row += ' ' + (c + 1 < line.size() ? gap + line[c] + ' ' : line[c]);
+        }
+        row.erase(row.find_last_not_of(' ') + 1);
+        text += row + '\n';
+    }
+    return text;
+}
+
+std::string Number(std::optional<double> value, const char* format = "%.4g")
+{
+    if (!value) return "-";
+    const double shown = *value + 0.0;
+    return format == std::string_view("%.3g") ? FormatText("%.3g", shown)
+                                              : FormatText("%.4g", shown);
+}
+
+std::string CellText(const T_JUDGED_CELL& cell)
+{
+    if (cell.number) return Number(cell.number);
+    return cell.text.empty() ? "-" : cell.text;
+}
+
+using C = JUDGED_COLUMN;
+/// Columns of the terminal: what has a line of its own there is left out.
+constexpr std::array kShown{
+    C::Element,    C::End,    C::Axis,          C::N,          C::M,
+    C::V,          C::Span,   C::ThetaY,        C::Theta,      C::ThetaCapacity,
+    C::ThetaRatio, C::Shear,  C::ShearCapacity, C::ShearRatio, C::Governing,
+    C::Clause,     C::Verdict};
+
+std::string RowLines(const T_JUDGEMENT& j, const T_JUDGED_STATE& state, std::size_t most)
+{
+    const auto heads = JudgedHeads(j.units);
+    T_LINES lines(1);
+    for (const C column : kShown)
+        lines.front().push_back(heads[static_cast<std::size_t>(column)]);
+    const std::size_t shown = most == 0 ? state.rows.size() : std::min(most, state.rows.size());
+    for (std::size_t i = 0; i < shown; ++i) {
+        const T_JUDGED_CELLS cells = CellsOf(j, state, state.rows[i]);
+        std::vector<std::string>& line = lines.emplace_back();
+        for (const C column : kShown)
+            line.push_back(CellText(At(cells, column)));
+        const std::string& why = At(cells, C::Reason).text;
+        if (!why.empty()) line.back() += " (" + why + ")";
+    }
+    std::string text = Table(lines);
+    if (shown < state.rows.size())
+        text +=
+            "  " + Say("IDS_QM_JUDGE_MORE_ROWS", std::to_string(state.rows.size() - shown)) + '\n';
+    return text;
+}
+
+std::string DriftLine(const T_JUDGED_STATE& state)
+{
+    std::string text;
+    for (const T_STOREY_AT_POINT& storey : state.drifts)
+        text += (text.empty() ? "" : ", ") + storey.name + FormatText(" %.4g", storey.drift);
+    return text.empty() ? text : "  " + Say("IDS_QM_JUDGE_DRIFTS", text) + '\n';
+}
+
+std::string StateLines(const T_JUDGEMENT& j, const T_JUDGED_STATE& state, std::size_t most)
+{
+    const std::string at = Number(FromSi(state.point.displacement, j.units, kDimLength)) + " " +
+                           std::string(NameOf(j.units.length));
+    std::string text = "\n" + Say("IDS_QM_JUDGE_STATE", StateAtText(j, state), at);
+    if (state.found != AT_POINT::Reached)
+        return text + ": " + VerdictText(VERDICT::NotChecked) + " (" + WhyNot(state.found) + ")\n";
+    text += ": " + VerdictCountText(state.all) + '\n';
+    for (const T_VERDICT_COUNT& storey : state.storeys)
+        if (!storey.storey.empty())
+            text += "  " + storey.storey + ": " + VerdictCountText(storey) + '\n';
+    text += DriftLine(state);
+    if (!state.shearAt.empty()) text += "  ! " + state.shearAt + '\n';
+    return text + RowLines(j, state, most);
+}
+
+/// "0.123 m at 3 J My", or why not.
+std::vector<std::string> LimitCells(const T_JUDGEMENT& j, const T_JUDGED_LIMIT& limit)
+{
+    const auto shown = [&](std::optional<double> si) {
+        return Number(si ? std::optional(FromSi(*si, j.units, kDimLength)) : si);
+    };
+    const auto product = limit.factor && limit.demandPga
+                             ? std::optional(*limit.factor * *limit.demandPga)
+                             : std::nullopt;
+    const auto ratio = limit.capacity && limit.demand && *limit.demand > 0.0
+                           ? std::optional(*limit.capacity / *limit.demand)
+                           : std::nullopt;
+    std::string remark = limit.why;
+    if (limit.first.unchecked > 0 && limit.first.unchecked < j.ends.size())
+        remark += (remark.empty() ? "" : "; ") +
+                  Say("IDS_QM_JUDGE_UNCHECKED_ENDS", std::to_string(limit.first.unchecked));
+    return {limit.state,
+            ModeText(limit.first.mode),
+            limit.first.end ? EndText(j.ends[*limit.first.end]) : "-",
+            shown(limit.capacity),
+            shown(limit.demand),
+            Number(ratio),
+            Number(limit.factor),
+            Number(product),
+            Number(limit.demandPga),
+            remark};
+}
+
+std::string LimitLines(const T_JUDGEMENT& j)
+{
+    if (j.limits.empty()) return {};
+    const std::string length = " (" + std::string(NameOf(j.units.length)) + ")";
+    T_LINES lines{{Say("IDS_QM_JUDGE_LIMIT_STATE"), Say("IDS_QM_JUDGE_GOVERNING"),
+                   Say("IDS_QM_JUDGE_FIRST_END"), Say("IDS_QM_JUDGE_CAPACITY") + length,
+                   Say("IDS_QM_JUDGE_DEMAND") + length, Say("IDS_QM_JUDGE_SHARE"), "PGA_C/PGA_D",
+                   "PGA_C (g)", "PGA_D (g)", ""}};
+    for (const T_JUDGED_LIMIT& limit : j.limits)
+        lines.push_back(LimitCells(j, limit));
+    return "\n" + Say("IDS_QM_JUDGE_LIMITS") + '\n' + Table(lines);
+}
+
+std::string TraceLines(const T_JUDGEMENT& j, const std::vector<T_CODE_TRACE>& trace)
+{
+    std::string text;
+    for (const T_CODE_TRACE& line : trace) {
+        const std::string unit = UnitText(line.dim, j.units);
+        text += "    " + line.symbol + " = " +
+                FormatText("%.6g", FromSi(line.value, j.units, line.dim)) +
+                (unit.empty() ? "" : " " + unit);
+        for (const std::string& part : {line.text, line.clause})
+            if (!part.empty()) text += "  " + part;
+        text += " [" + MarkText(line.mark) + "]\n";
+    }
+    return text;
+}
+
+} // namespace
+
+std::string JudgementText(const T_JUDGEMENT& j, std::size_t mostRows)
+{
+    std::string text =
+        "\n[ " +
+        Say("IDS_QM_JUDGE_TITLE", j.evaluation, j.push, std::string(NameOf(j.units.force)),
+            std::string(NameOf(j.units.length))) +
+        " ]\n";
+    if (!j.note.empty()) return text + "  " + j.note + '\n';
+    for (const T_JUDGED_STATE& state : j.states)
+        text += StateLines(j, state, mostRows);
+    text += LimitLines(j) + '\n';
+    for (const std::string& line : JudgementNotes(j))
+        text += "! " + line + '\n';
+    return text;
+}
+
+std::string JudgedLimitsText(const T_JUDGEMENT& j)
+{
+    std::string text;
+    const std::string unit(NameOf(j.units.length));
+    for (const T_JUDGED_LIMIT& limit : j.limits) {
+        const std::vector<std::string> cells = LimitCells(j, limit);
+        text += (text.empty() ? "" : "\n") + cells[0] + ", " + cells[1] + ": ";
+        if (limit.first.end)
+            text +=
+                Say("IDS_QM_JUDGE_PASS", cells[2], cells[3] + " " + unit, cells[4] + " " + unit);
+        if (limit.factor) text += "; PGA_C/PGA_D = " + cells[6] + ", PGA_C = " + cells[7] + " g";
+        if (!cells[9].empty()) text += (limit.first.end ? "; " : "") + cells[9];
+    }
+    return text;
+}
+
+std::string JudgementTrace(const T_JUDGEMENT& j)
+{
+    std::string text;
+    for (const T_JUDGED_STATE& state : j.states)
+        for (const T_JUDGED_ROW& row : state.rows) {
+            if (row.checks.rotationTrace.empty() && row.checks.shearTrace.empty()) continue;
+            text += "\n  " + StateText(j, state) + ", " + EndText(j.ends[row.end]) + '\n' +
+                    TraceLines(j, row.checks.rotationTrace) + TraceLines(j, row.checks.shearTrace);
+        }
+    return text;
+}

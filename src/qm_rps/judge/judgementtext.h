@@ -1,0 +1,13 @@
+// A judgement as text, in the chosen language: for the terminal and for reports.
+#pragma once
+
+#include "qm_rps/judge/judgementtable.h"
+
+/// Counts, first passes and the rows of every limit state. mostRows: of each state, the worst; 0:
+/// all.
+std::string JudgementText(const T_JUDGEMENT& judgement, std::size_t mostRows);
+/// A sentence for each limit state and mode: where along the push the first end is beyond it, and
+/// at what ground acceleration.
+std::string JudgedLimitsText(const T_JUDGEMENT& judgement);
+/// The numbers behind the checks of every row, with their clauses and marks.
+std::string JudgementTrace(const T_JUDGEMENT& judgement);

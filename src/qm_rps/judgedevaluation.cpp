@@ -1,0 +1,211 @@
+#include "qm_rps/judgedevaluation.h"
+
+#include "qm_base/say.h"
+#include "qm_db/recordfacts.h"
+#include "qm_rps/judge/spectrumfactor.h"
+#include "qm_rps/pushovercalculators.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace {
+
+/// The level of a limit state of an evaluation; empty: codes give no limit of members for it (SLO).
+std::optional<std::size_t> LevelOf(const std::string& state)
+{
+    for (const T_LEVELS& names : kLevelNames)
+        for (std::size_t i = 0; i < kLevels; ++i)
+            if (state == names[i]) return i;
+    return {};
+}
+
+/// The limit states that are judged at the points of an evaluation.
+std::vector<T_JUDGED_STATE> StatesOf(const T_HINGES_AT& hinges, const T_JUDGE_OPTIONS& options,
+                                     const T_LEVELS& names)
+{
+    std::vector<T_JUDGED_STATE> out;
+    const auto add = [&](const T_PUSH_AT_POINT& at, std::size_t level, const std::string& name) {
+        if (options.level && *options.level != level) return;
+        T_JUDGED_STATE& state = out.emplace_back();
+        state.point = at.point;
+        state.level = level;
+        state.name = name;
+        state.found = at.found;
+        state.drifts = at.storeys;
+    };
+    for (const T_PUSH_AT_POINT& at : hinges.points) {
+        if (at.point.kind == PUSH_POINT::Performance)
+            for (std::size_t i = 0; i < kLevels; ++i)
+                add(at, i, names[i]);
+        else if (at.point.kind == PUSH_POINT::Demand)
+            if (const auto level = LevelOf(at.point.state)) add(at, *level, at.point.state);
+    }
+    return out;
+}
+
+/// What a performance point's limit states are called: as the first end that is judged.
+const T_LEVELS& NamesOf(const std::vector<T_JUDGED_END>& ends)
+{
+    const auto end = std::ranges::find_if(
+        ends, [](const T_JUDGED_END& e) { return e.basis != JUDGE_BASIS::Nothing; });
+    return end == ends.end() ? kLevelNames[0] : end->Levels();
+}
+
+/// Takes the states of all ends from the steps of a push.
+class CPathTaker {
+public:
+    CPathTaker(const T_MODEL& model, const T_JUDGE_OPTIONS& options)
+        : m_model(model), m_options(options)
+    {
+    }
+    void Take(const T_STEP_FORCES& step)
+    {
+        if (step.step == 0) {
+            ends = JudgedEnds(m_model, step.run, m_options);
+            path = {};
+        }
+        path.displacement.push_back(step.run.displacement[step.step]);
+        path.baseReaction.push_back(step.run.baseReaction[step.step]);
+        std::vector<T_END_STATE>& states = path.ends.emplace_back();
+        for (const T_JUDGED_END& end : ends)
+            states.push_back(end.axes.length > 0.0 ? EndState(end.place, end.axes, end.hinge, step)
+                                                   : T_END_STATE{});
+    }
+
+    std::vector<T_JUDGED_END> ends;
+    T_JUDGED_PATH path;
+
+private:
+    const T_MODEL& m_model;
+    const T_JUDGE_OPTIONS& m_options;
+};
+
+/// What the evaluation's method finds with its spectrum times a factor, by limit state; m.
+class CScaledEvaluation {
+public:
+    CScaledEvaluation(CDBDoc& doc, const T_EVAL_D& eval)
+        : m_doc(doc), m_eval(eval), m_evaluator(doc, RunPerfPtProcedure)
+    {
+        m_evaluator.SetStoreSteps(false);
+        m_evaluator.SetFindAllPoints(false);
+        T_FINDING refusal;
+        m_isSet = m_evaluator.SetEvaluation(eval, refusal) != 0;
+    }
+    /// state: of a target displacement; else the performance point.
+    std::optional<double> At(double factor, const std::string& state)
+    {
+        if (!m_isSet) return {};
+        m_evaluator.SetSpectrumFactor(factor);
+        (void)m_evaluator.Evaluate();
+        const T_PUSH_EVALUATION& e = m_evaluator.Result();
+        std::optional<double> found;
+        if (!e.IsTarget() && e.point) found = e.point->D;
+        for (const T_LIMIT_ROW& row : e.limitStates)
+            if (row.name == state) found = row.demand;
+        if (!found || !std::isfinite(*found)) return {};
+        return std::fabs(ToSi(*found, e.units, kDimLength));
+    }
+    /// Ground acceleration of the spectrum of a limit state, g; empty: a table that does not begin
+    /// at the period 0.
+    std::optional<double> Pga(const std::string& state) const
+    {
+        int key = 0;
+        T_SPFC_D record;
+        if (!m_doc.Attr().FindSpfc(m_eval.spectrum, key) || !m_doc.Attr().GetSpfc(key, record))
+            return {};
+        const auto* const table = std::get_if<T_SPFC_USER>(&record.data);
+        if (table && table->T.front() > 0.0) return {};
+        const auto at = std::ranges::find(kLimitStateNames, state);
+        const LIMIT_STATE limit = at == kLimitStateNames.end()
+                                      ? LIMIT_STATE::SLV
+                                      : static_cast<LIMIT_STATE>(at - kLimitStateNames.begin());
+        const auto spectrum = MakeDesignSpectrum(record, m_eval.behavior.value_or(0), limit);
+        if (!spectrum) return {};
+        return spectrum->CalcSaAt(0.0);
+    }
+
+private:
+    CDBDoc& m_doc;
+    const T_EVAL_D& m_eval;
+    CPushEvaluator m_evaluator;
+    bool m_isSet = false;
+};
+
+T_JUDGED_LIMIT LimitOf(const T_FIRST_PASS& first, const T_JUDGED_STATE& state,
+                       const T_JUDGED_PATH& path, double start, CScaledEvaluation& scaled)
+{
+    T_JUDGED_LIMIT limit;
+    limit.first = first;
+    limit.state = state.name;
+    limit.demand = std::fabs(state.point.displacement - start);
+    limit.demandPga = scaled.Pga(state.point.state);
+    if (!first.end) {
+        const bool none = !path.ends.empty() && first.unchecked == path.ends.front().size();
+        limit.why = Say(none ? "IDS_QM_JUDGE_NO_END" : "IDS_QM_JUDGE_NOT_PASSED");
+        return limit;
+    }
+    limit.capacity = std::fabs(first.displacement - start);
+    if (first.atStart) {
+        limit.why = Say(path.hasStart ? "IDS_QM_JUDGE_AT_START" : "IDS_QM_JUDGE_AT_FIRST");
+        return limit;
+    }
+    limit.factor = FactorFor(*limit.capacity, *limit.capacity / *limit.demand,
+                             [&](double factor) { return scaled.At(factor, state.point.state); });
+    if (!limit.factor) limit.why = Say("IDS_QM_JUDGE_NO_FACTOR");
+    return limit;
+}
+
+void FindLimits(CDBDoc& doc, const T_PUSH_EVALUATION& result, const T_JUDGED_PATH& path,
+                double start, T_JUDGEMENT& out)
+{
+    const std::vector<T_FIRST_PASS> passes = FirstPasses(out.ends, path, out.options.factors);
+    CScaledEvaluation scaled(doc, result.eval);
+    for (const T_JUDGED_STATE& state : out.states)
+        for (const T_FIRST_PASS& first : passes)
+            if (first.level == state.level)
+                out.limits.push_back(LimitOf(first, state, path, start, scaled));
+}
+
+/// The state of the path at a displacement that is one of its steps.
+std::optional<std::size_t> IndexAt(const T_JUDGED_PATH& path, double displacement)
+{
+    constexpr double kSame = 1e-9; // of the largest, as steps are told from one another
+    double furthest = 0.0;
+    for (const double d : path.displacement)
+        furthest = std::max(furthest, std::fabs(d));
+    const auto at = std::ranges::find_if(path.displacement, [&](double d) {
+        return std::fabs(d - displacement) <= kSame * furthest;
+    });
+    if (at == path.displacement.end()) return {};
+    return static_cast<std::size_t>(at - path.displacement.begin());
+}
+
+} // namespace
+
+T_JUDGEMENT JudgeEvaluation(CDBDoc& doc, const T_PUSH_EVALUATION& result,
+                            const T_JUDGE_OPTIONS& options, const PUSH_PROGRESS_FN& progress)
+{
+    T_JUDGEMENT out;
+    out.evaluation = result.eval.name.empty() ? MethodName(result.eval.method) : result.eval.name;
+    out.push = result.eval.push;
+    out.units = result.units;
+    out.options = options;
+    CPathTaker taker(doc.Data().Model(), options);
+    T_PUSH_RUN run;
+    const T_HINGES_AT hinges = PushToEvaluation(
+        doc, result, progress, run, [&](const T_STEP_FORCES& step) { taker.Take(step); });
+    out.note = hinges.note;
+    if (hinges.push.empty()) out.note = Say("IDS_QM_JUDGE_OTHER_PUSH");
+    if (out.note.empty() && hinges.points.empty()) out.note = Say("IDS_QM_JUDGE_NO_POINT");
+    if (!out.note.empty()) return out;
+    out.ends = std::move(taker.ends);
+    T_JUDGED_PATH path = std::move(taker.path);
+    PutStart(run.startDisplacement, path);
+    out.states = StatesOf(hinges, options, NamesOf(out.ends));
+    for (T_JUDGED_STATE& state : out.states)
+        if (state.found == AT_POINT::Reached)
+            if (const auto index = IndexAt(path, state.point.displacement))
+                JudgeState(out.ends, path, *index, options.factors, state);
+    FindLimits(doc, result, path, run.startDisplacement, out);
+    return out;
+}
