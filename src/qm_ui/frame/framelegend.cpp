@@ -39,9 +39,9 @@ struct T_ENTRY {
     std::function<void(QPainter&, QPointF middle)> swatch;
 };
 
-T_ENTRY LineEntry(const char* key, const QPen& pen)
+T_ENTRY LineEntry(const QString& text, const QPen& pen)
 {
-    return {Text(key), [pen](QPainter& p, QPointF m) {
+    return {text, [pen](QPainter& p, QPointF m) {
                 p.setPen(pen);
                 p.drawLine(m - QPointF(kSwatch / 2, 0), m + QPointF(kSwatch / 2, 0));
             }};
@@ -76,6 +76,15 @@ void AddStates(const T_HINGE_MARKS& marks, std::vector<T_ENTRY>& out)
     }
 }
 
+/// Every band, so that the legend keeps its lines, and how many member ends are in it.
+void AddBands(const T_RATIO_BANDS& bands, std::vector<T_ENTRY>& out)
+{
+    for (std::size_t band = 0; band < kBands; ++band) {
+        const std::string text = BandText(band) + ": " + std::to_string(bands.count[band]);
+        out.push_back(LineEntry(QString::fromStdString(text), BandPen(band)));
+    }
+}
+
 std::vector<T_ENTRY> Entries(const T_FRAME_PICTURE& picture, const T_FRAME_OPTIONS& options)
 {
     const T_FRAME_SCENE& scene = *picture.scene;
@@ -85,13 +94,15 @@ std::vector<T_ENTRY> Entries(const T_FRAME_PICTURE& picture, const T_FRAME_OPTIO
         {ELEM_KIND::Truss, "IDS_QM_UI_FRAME_TRUSSES"},
         {ELEM_KIND::Link, "IDS_QM_UI_FRAME_LINKS"}};
     for (const auto& [kind, key] : kinds)
-        if (HasKind(scene, kind)) out.push_back(LineEntry(key, FramePen(kind, false, true)));
+        if (HasKind(scene, kind)) out.push_back(LineEntry(Text(key), FramePen(kind, false, true)));
     if (picture.displacement && options.undeformed)
-        out.push_back(LineEntry("IDS_QM_UI_FRAME_BEFORE", FramePen(ELEM_KIND::Beam, true, true)));
+        out.push_back(
+            LineEntry(Text("IDS_QM_UI_FRAME_BEFORE"), FramePen(ELEM_KIND::Beam, true, true)));
     if (options.supports)
         out.push_back({Text("IDS_QM_UI_FRAME_SUPPORTS"), [](QPainter& p, QPointF m) {
                            p.fillRect(QRectF(m.x() - 5, m.y() - 3, 10, 6), kSupportColor);
                        }});
+    if (picture.bands) AddBands(*picture.bands, out);
     if (options.hinges && picture.marks) AddStates(*picture.marks, out);
     const bool hinged = !picture.marks && std::ranges::any_of(scene.lines, [](const auto& l) {
         return l.hingeI || l.hingeJ;
@@ -201,6 +212,14 @@ QPen FramePen(ELEM_KIND kind, bool faint, bool thick)
     default:
         return {QColor(0x15, 0x4e, 0x8c), width};
     }
+}
+
+QPen BandPen(std::size_t band)
+{
+    // Up to 0.5, 0.8, 1 and 1.5; beyond; not checked.
+    constexpr std::array<QRgb, kBands> kColors{0xff2e7d32, 0xff9e9d24, 0xfff9a825,
+                                               0xffe64a19, 0xff7f0000, 0xff90a4ae};
+    return {QColor(kColors[band]), 3.6, Qt::SolidLine, Qt::FlatCap};
 }
 
 void DrawHingeState(QPainter& painter, QPointF at, PUSH_STATE state)

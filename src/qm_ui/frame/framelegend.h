@@ -12,6 +12,9 @@ inline const QColor kHingeColor{0xef, 0x6c, 0x00};
 /// Pen of the lines of a kind of elements; faint: of the frame as it was.
 QPen FramePen(ELEM_KIND kind, bool faint, bool thick);
 
+/// Pen of a band of ratios (ratiobands.h).
+QPen BandPen(std::size_t band);
+
 /// A hinge in a state, by colour and shape.
 void DrawHingeState(QPainter& painter, QPointF at, PUSH_STATE state);
 

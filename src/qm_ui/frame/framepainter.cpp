@@ -125,6 +125,21 @@ void CFramePainter::DrawLines(QPainter& painter, const T_FRAME_SCENE& scene,
     }
 }
 
+/// Each half of a member in the colour of its end, the worst bands on top.
+void CFramePainter::DrawBands(QPainter& painter, const T_FRAME_PICTURE& picture) const
+{
+    for (std::size_t step = 0; step < kBands; ++step) {
+        const std::size_t band = step == 0 ? kBandUnchecked : step - 1;
+        painter.setPen(BandPen(band));
+        for (const T_BANDED_HALF& half : picture.bands->halves) {
+            if (half.band != band) continue;
+            const T_SCENE_LINE& line = picture.scene->lines[half.line];
+            const QPointF i = m_moved[line.i], j = m_moved[line.j];
+            painter.drawLine(half.atJ ? j : i, 0.5 * (i + j));
+        }
+    }
+}
+
 /// Of a model without elements, whose results came from another solver.
 void CFramePainter::DrawNodes(QPainter& painter) const
 {
@@ -246,6 +261,7 @@ void CFramePainter::DrawForeground(QPainter& painter, const QRectF& rect,
     PlaceMoved(picture, camera);
     painter.setRenderHint(QPainter::Antialiasing, scene.lines.size() <= kSmooth);
     DrawLines(painter, scene, m_moved, false);
+    if (picture.bands) DrawBands(painter, picture);
     painter.setRenderHint(QPainter::Antialiasing, true);
     if (scene.lines.empty()) DrawNodes(painter);
     m_hinges.clear();

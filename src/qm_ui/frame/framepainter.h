@@ -2,6 +2,7 @@
 #pragma once
 
 #include "qm_rps/desk/hingemarks.h"
+#include "qm_rps/judge/ratiobands.h"
 
 #include <QLineF>
 #include <QPointF>
@@ -46,6 +47,7 @@ struct T_FRAME_PICTURE {
     std::string note;                                                 // more about it
     std::vector<T_SCENE_DRIFT> drifts;
     const T_HINGE_MARKS* marks = nullptr; // hinges by their states; null: in one colour
+    const T_RATIO_BANDS* bands = nullptr; // ends of members by their ratios; null: none
 };
 
 /// Lengths are px at 96 dpi. State: buffers that are used again for the next picture.
@@ -71,6 +73,7 @@ private:
     void PlaceMoved(const T_FRAME_PICTURE& picture, const T_CAMERA& camera);
     void DrawLines(QPainter& painter, const T_FRAME_SCENE& scene, const std::vector<QPointF>& at,
                    bool faint);
+    void DrawBands(QPainter& painter, const T_FRAME_PICTURE& picture) const;
     void DrawNodes(QPainter& painter) const;
     void DrawSupports(QPainter& painter, const T_FRAME_SCENE& scene) const;
     void DrawHinges(QPainter& painter, const T_FRAME_SCENE& scene) const;
