@@ -131,14 +131,6 @@ EXIT_CODE PushEvaluated(CDBDoc& doc, const T_EVALUATE_OPTIONS& o)
     return PushWhereMissing(doc, o.file, keys);
 }
 
-/// The path itself for one evaluation; for several a number before the extension.
-std::string NumberedPath(const std::string& path, std::size_t index, std::size_t count)
-{
-    if (count == 1) return path;
-    const std::string stem = CFileCtrl::GetFilePathAndNameWithoutExtension(path);
-    return stem + "-" + std::to_string(index + 1) + path.substr(stem.size());
-}
-
 /// Where the results of so many evaluations go.
 std::vector<T_OUTPUT> OutputsOf(const T_EVALUATE_OPTIONS& o, std::size_t count)
 {

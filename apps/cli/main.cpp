@@ -56,6 +56,7 @@ int RunCommand(int argc, char** argv)
     AddCase(app, code);
     AddAnalyse(app, code);
     AddPush(app, code);
+    AddJudge(app, code);
     AddUlf(app, code);
     AddReport(app, code);
     try {

@@ -56,6 +56,13 @@ EXIT_CODE WriteOutput(const std::string& path, std::string_view text)
     return CFileCtrl::WriteWholeFile(path, text, error) ? EXIT_CODE::Done : ReportFileError(error);
 }
 
+std::string NumberedPath(const std::string& path, std::size_t index, std::size_t count)
+{
+    if (count == 1) return path;
+    const std::string stem = CFileCtrl::GetFilePathAndNameWithoutExtension(path);
+    return stem + "-" + std::to_string(index + 1) + path.substr(stem.size());
+}
+
 #ifdef QM_UI
 EXIT_CODE WritePicture(const T_PLOT& plot, const std::string& path)
 {

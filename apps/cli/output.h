@@ -29,6 +29,9 @@ EXIT_CODE CheckOutputs(const std::string& input, const std::vector<T_OUTPUT>& ou
 /// Writes to a file, or to standard output for "-".
 EXIT_CODE WriteOutput(const std::string& path, std::string_view text);
 
+/// The path itself for one result; for several a number before the extension.
+std::string NumberedPath(const std::string& path, std::size_t index, std::size_t count);
+
 /// Draws the plot; nothing for an empty path.
 EXIT_CODE WritePicture(const T_PLOT& plot, const std::string& path);
 

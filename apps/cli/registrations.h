@@ -29,4 +29,5 @@ void AddPush(CLI::App& app, EXIT_CODE& code);
 void AddPushSetup(CLI::App& push, EXIT_CODE& code);
 void AddCaseGenerate(CLI::App& cases, EXIT_CODE& code);
 void AddSection(CLI::App& app, EXIT_CODE& code);
+void AddJudge(CLI::App& app, EXIT_CODE& code);
 void AddReport(CLI::App& app, EXIT_CODE& code);

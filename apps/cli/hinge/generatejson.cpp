@@ -1,7 +1,7 @@
 #include "hinge/generatehinges.h"
 
 #include "qm_rps/generate/codehingerows.h"
-#include "json/codejson.h"
+#include "json/tracejson.h"
 
 #include <algorithm>
 
@@ -41,7 +41,7 @@ void WriteHinge(CJsonText& w, const T_CODE_ROW_OF_HINGE& row, const T_UNITS& uni
         w.Member("shear_strength", FromSi(row.of->shearStrength, units, kDimForce));
     }
     WriteBackbone(w, row.of->bone, row.component, units);
-    WriteTrace(w, row.of->trace, units);
+    WriteTrace(w, "trace", row.of->trace, units);
     WriteWarnings(w, row.of->warnings);
     w.End();
 }

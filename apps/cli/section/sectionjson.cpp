@@ -1,5 +1,5 @@
 #include "section/sectioncommands.h"
-#include "json/codejson.h"
+#include "json/tracejson.h"
 
 #include <algorithm>
 #include <cmath>
@@ -167,7 +167,7 @@ void CWriter::Answer(const T_SECTION_ANSWER& a)
     m_w.Member("direction_of", a.ofMoment ? "moment" : "bending");
     if (a.compression > 0.0) m_w.Member("compression_strength", In(a.compression, kDimForce));
     if (a.compression > 0.0) m_w.Member("tension_strength", In(a.tension, kDimForce));
-    WriteTrace(m_w, a.trace, m_units);
+    WriteTrace(m_w, "trace", a.trace, m_units);
     WriteWarnings(m_w, a.warnings);
     switch (a.task) {
     case SECTION_TASK::Capacity:

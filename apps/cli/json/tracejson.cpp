@@ -1,16 +1,6 @@
-#include "json/codejson.h"
+#include "json/tracejson.h"
 
 #include "qm_rps/generate/codehingerows.h"
-
-#include <array>
-
-namespace {
-
-constexpr std::array<const char*, 4> kMarks{
-    "computed", "sighted twice", "sighted once",
-    "recalled: not checked against the printed standard"}; // by CODE_MARK
-
-} // namespace
 
 void WriteWarnings(CJsonText& w, const std::vector<T_CODE_WARNING>& warnings)
 {
@@ -20,14 +10,16 @@ void WriteWarnings(CJsonText& w, const std::vector<T_CODE_WARNING>& warnings)
     w.Items("warnings", texts, kJsonNested);
 }
 
-void WriteTrace(CJsonText& w, const std::vector<T_CODE_TRACE>& trace, const T_UNITS& units)
+void WriteTrace(CJsonText& w, const char* name, const std::vector<T_CODE_TRACE>& trace,
+                const T_UNITS& units)
 {
-    w.Key("trace").List();
+    w.Key(name).List();
     for (const T_CODE_TRACE& line : trace) {
         w.Object(kJsonOneLine);
         w.Member("symbol", line.symbol).Member("value", FromSi(line.value, units, line.dim));
         w.Member("unit", UnitText(line.dim, units)).Member("clause", line.clause);
-        w.Member("formula", line.text).Member("mark", kMarks[static_cast<std::size_t>(line.mark)]);
+        w.Member("formula", line.text)
+            .Member("mark", kMarkWords[static_cast<std::size_t>(line.mark)]);
         w.End();
     }
     w.End();

@@ -1,0 +1,178 @@
+// Member ends judged through the program: the cantilever of tests/oracle/judgement.py, whose chord
+// rotation is the displacement of its top over 3 m, and whose M / V is 3 m.
+#include "office.h"
+#include "program.h"
+
+#include <algorithm>
+#include <array>
+#include <cmath>
+
+namespace {
+
+// theta_y, SD, NC; the two parts of VR, kN.
+constexpr std::array kCapacity{0.011621170792608007, 0.75 * 0.03236395760998197,
+                               0.03236395760998197};
+constexpr double kAxial = 24.90940718540595, kCyclic = 80.49401005269928;
+
+/// 0.40 x 0.40 with 8 bars of 18 mm under 640 kN, with a mass of 60 t and T = 0.82 s; an EN 1998-1
+/// spectrum whose plateau ends at 0.6 s, so that displacements grow as the ground acceleration.
+json Cantilever()
+{
+    json file = json::parse(R"({"format": "qm-rps case 1",
+        "units": {"force": "kN", "length": "m"}, "plane": "XZ",
+        "design_codes": {"concrete": "Eurocode2:04", "steel": "Eurocode3:05"},
+        "nodes": [{"id": 1, "xyz": [0, 0, 0], "restraint": [1, 1, 1, 1, 1, 1]},
+                  {"id": 2, "xyz": [0, 0, 3], "mass": [60, 0, 0]}],
+        "storeys": [{"name": "1F", "height": 3, "nodes": [2]}],
+        "modes": [{"period": 0.816, "shape": {"2": [1, 0, 0, 0, 0.5, 0]}}],
+        "materials": [{"name": "C", "type": "concrete", "E": 15e6, "nu": 0.2, "fck": 20000,
+                       "fyk": 400000, "Es": 2e8, "knowledge": "KL2",
+                       "mean": {"fc": 28000, "fy": 450000}}],
+        "sections": [{"name": "column", "shape": "rectangle", "size": [0.4, 0.4],
+                      "detailing": {"cover": 0.03, "stirrup_diameter": 0.008,
+                                    "stirrup_spacing": 0.15}}],
+        "elements": [{"id": 1, "nodes": [1, 2], "material": "C", "section": "column"}],
+        "load_cases": [{"name": "G", "nodal": [{"node": 2, "load": [0, 0, -640, 0, 0, 0]}]},
+                       {"name": "X", "nodal": [{"node": 2, "load": [1, 0, 0, 0, 0, 0]}]}],
+        "pushover_control": {"initial_loads": [{"case": "G", "factor": 1}]},
+        "spectra": [{"name": "S", "kind": "ec8-2004", "type": 1, "soil": "C", "ag": 0.15}],
+        "pushover": [{"name": "P", "control_node": 2, "direction": "DX",
+            "pattern": {"kind": "static"},
+            "patterns": [{"kind": "static", "number": 2, "factor": 1}],
+            "control": {"increment_method": "displacement", "master_node_control": true,
+                        "master_max_displ": 0.14}, "steps": 20}],
+        "evaluations": [{"name": "E", "push": "P", "method": "EC8/OPCM", "spectrum": "S"}]})");
+    for (const double y : {-0.153, 0.0, 0.153})
+        for (const double z : {-0.153, 0.0, 0.153})
+            if (y != 0.0 || z != 0.0)
+                file["sections"][0]["bars"].push_back({{"y", y}, {"z", z}, {"area", 254.469e-6}});
+    return file;
+}
+
+const json& EndOf(const json& state, const std::string& end)
+{
+    for (const json& row : state.at("ends"))
+        if (row.at("end") == end) return row;
+    throw std::out_of_range(end);
+}
+
+class Judge : public CProgramTest {
+protected:
+    /// The cantilever with the hinges of a code.
+    void Generate(const std::string& code) const
+    {
+        Write("c.json", Cantilever().dump(1));
+        Done("hinge generate c.json --code " + code + " --all -o g.json --overwrite");
+    }
+};
+
+} // namespace
+
+TEST_F(Judge, CantileverByHand)
+{
+    json weak = Cantilever(); // its hinge yields and keeps its strength up to these demands
+    weak["spectra"][0]["ag"] = 0.11;
+    Write("w.json", weak.dump(1));
+    Done("hinge generate w.json --code EN1998-3 --all -o g.json");
+    Write("c.json", Cantilever().dump(1));
+    for (const char* const file : {"c.json", "g.json"}) {
+        const json judged = Json("judge " + std::string(file) + " --code EN1998-3 --trace").at(0);
+        ASSERT_EQ(3U, judged.at("limit_states").size());
+        for (std::size_t i = 0; i < 3; ++i) {
+            const json& state = judged["limit_states"][i];
+            const double d = state.at("displacement");
+            const json& foot = EndOf(state, "I");
+            const double theta = d / 3.0; // the top alone moves
+            const double V = std::fabs(foot.at("V").get<double>());
+            EXPECT_NEAR(640.0, foot.at("N"), 1e-6);
+            EXPECT_NEAR(3.0 * V, std::fabs(foot.at("M").get<double>()), 1e-6);
+            EXPECT_NEAR(3.0, foot.at("LV"), 1e-9);
+            EXPECT_NEAR(theta / kCapacity[i], foot.at("rotation").at("ratio"), 1e-6);
+            const double mu = std::clamp(theta / kCapacity[0] - 1.0, 0.0, 5.0);
+            EXPECT_NEAR(V, foot.at("shear").at("demand"), 1e-9);
+            EXPECT_NEAR(V / (kAxial + (1.0 - 0.05 * mu) * kCyclic), foot.at("shear").at("ratio"),
+                        1e-5);
+            EXPECT_EQ("EN 1998-3 (A.12)", foot["shear"].at("clause"));
+            EXPECT_FALSE(foot.at("rotation_trace").empty());
+            EXPECT_NEAR(d / 3.0, state.at("drifts").at(0).at("drift"), 1e-9);
+        }
+    }
+}
+
+// Elastic: V = 3 EI d / 27 reaches VR without plastic rotation at (24.909 + 80.494) / 3555.6 m, the
+// rotations theta at 3 theta. Beyond TC displacements grow as the ground acceleration.
+TEST_F(Judge, FirstPassesAndGroundAccelerationsByHand)
+{
+    Write("c.json", Cantilever().dump(1));
+    const json judged = Json("judge c.json --code EN1998-3").at(0);
+    const double shear = (kAxial + kCyclic) / (3.0 * 15e6 * std::pow(0.4, 4) / 12.0 / 27.0);
+    ASSERT_EQ(6U, judged.at("first_passes").size());
+    for (const json& pass : judged["first_passes"]) {
+        const std::string name = pass.at("name");
+        const double limit = 3.0 * kCapacity[name == "DL" ? 0 : name == "SD" ? 1 : 2];
+        EXPECT_EQ("I", pass.at("end")) << name;
+        EXPECT_NEAR(pass.at("mode") == "shear" ? shear : limit, pass.at("capacity_displacement"),
+                    1e-7)
+            << name;
+        EXPECT_NEAR(pass.at("capacity_displacement").get<double>() /
+                        pass.at("demand_displacement").get<double>(),
+                    pass.at("spectrum_factor"), 1e-5)
+            << name;
+        EXPECT_NEAR(0.15 * 1.15, pass.at("demand_pga"), 1e-12); // ag S
+    }
+}
+
+TEST_F(Judge, SaysWhatIsNotCheckedAndWhy)
+{
+    Write("c.json", Cantilever().dump(1));
+    const json bare = Json("judge c.json").at(0);
+    EXPECT_EQ("not checked", bare.at("verdict"));
+    const json& end = bare.at("limit_states").at(0).at("ends").at(0);
+    EXPECT_EQ("not checked", end.at("verdict"));
+    EXPECT_NE("", end.at("rotation").at("reason"));
+    // A code for all members: the elastic column has chord rotations.
+    const json named = Json("judge c.json --code EN1998-3 --limit-state SD").at(0);
+    ASSERT_EQ(1U, named.at("limit_states").size());
+    EXPECT_EQ("SD", named["limit_states"][0].at("name"));
+    EXPECT_NEAR(named["limit_states"][0].at("displacement").get<double>() / 3.0 / kCapacity[1],
+                EndOf(named["limit_states"][0], "I").at("rotation").at("ratio"), 1e-6);
+    json poor = Cantilever();
+    poor["materials"][0].erase("knowledge");
+    Write("p.json", poor.dump(1));
+    const json lacks = Json("judge p.json --code EN1998-3").at(0);
+    EXPECT_EQ("not checked", lacks.at("verdict"));
+    ExpectHolds(lacks["limit_states"][0]["ends"][0]["rotation"]["reason"], {"knowledge"});
+    ExpectRefused("judge c.json --evaluation NONE", 2, "NONE");
+    ExpectRefused("judge c.json --level secondary", 2, "--code");
+}
+
+TEST_F(Judge, TableReportSheetAndPictureTellTheSame)
+{
+    Generate("ASCE41-17");
+    const std::string table =
+        Done("judge g.json --report r.txt --sheet s.xlsx --plot p.svg --trace");
+    const json judged = Json("judge g.json").at(0);
+    ExpectHolds(table, {"SD (LS)", "Beam-column joints are not checked", "kappa",
+                        "not checked against the printed standard"});
+    ExpectHolds(Text("r.txt"), {"SD (LS)", "PGA_C/PGA_D"});
+    ExpectHolds(Text("p.svg"), {"<svg"});
+    ExpectRefused("judge g.json --sheet s.xlsx", 4, "s.xlsx");
+    if (!COffice::IsThere()) GTEST_SKIP() << "soffice or python3 is not installed";
+    const OFFICE_CELLS cells = COffice().Recalculated((m_folder / "s.xlsx").string());
+    ASSERT_LT(13U, cells.size()); // heads in row 8, six rows below: three states, two ends
+    std::size_t rows = 0;
+    for (const json& state : judged.at("limit_states"))
+        for (const json& row : state.at("ends")) {
+            const auto& line = cells.at(8 + rows++);
+            EXPECT_EQ(row.at("end"), line.at(3));
+            for (const auto& [mode, column] : {std::pair{"rotation", 14U}, {"shear", 17U}})
+                EXPECT_NEAR(row.at(mode).at("ratio").get<double>(),
+                            line.at(column).empty() ? 0.0 : std::stod(line.at(column)), 1e-9)
+                    << mode;
+        }
+    const json& count = judged["limit_states"];
+    double fulfilled = 0.0;
+    for (const json& state : count)
+        fulfilled += state.at("count").at("fulfilled").get<double>();
+    EXPECT_EQ(fulfilled, std::stod(cells.at(2).at(1)));
+}
