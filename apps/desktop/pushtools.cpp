@@ -3,9 +3,11 @@
 #include "mainwindow.h"
 
 #include "qm_rps/pushoverhingestatedlg.h"
+#include "qm_rps/pushoverjudgementdlg.h"
 #include "qm_rps/pushoverrundlg.h"
 #include "qm_rps/pushoverstoreydlg.h"
 #include "qm_ui/form/dialogwindow.h"
+#include "qm_ui/push/judgeview.h"
 #include "qm_ui/push/pushresultviews.h"
 
 namespace {
@@ -65,12 +67,25 @@ std::unique_ptr<CPushOverHingeStateDlg> AtPoint(CDBDoc& doc)
     return dialog;
 }
 
+/// The ends of the frame by EN 1998-3, at the demands of its evaluation.
+std::unique_ptr<CPushOverJudgementDlg> Judged(CDBDoc& doc)
+{
+    (void)Push(doc);
+    auto dialog = std::make_unique<CPushOverJudgementDlg>(doc);
+    T_PUSH_EVALUATION evaluation;
+    std::string error;
+    if (EvaluateStored(doc, "PX EC8", evaluation, error) && dialog->OnJudge(evaluation, {}, error))
+        dialog->OnSelChangeCode(static_cast<int>(HINGE_CODE::En1998) + 1);
+    return dialog;
+}
+
 } // namespace
 
 void RegisterPushViews(CViewFactory& factory)
 {
     RegisterPushRunView(factory);
     RegisterPushResultViews(factory);
+    RegisterJudgementView(factory);
 }
 
 T_COMMANDS PushCommands(T_DESKTOP& desktop)
@@ -110,6 +125,7 @@ std::vector<T_WINDOW_EXAMPLE> PushWindowExamples()
                 "push-states-space", "eccentric-building",
                 [](CDBDoc& doc) { return Pushed<CPushOverHingeStateDlg>(doc, 1.0); }),
             Example<CPushOverHingeStateDlg>("push-states-point", "eccentric-building", AtPoint),
+            Example<CPushOverJudgementDlg>("push-judgement", "rc-frame-code-hinges", Judged),
             Example<CPushOverStoreyDlg>("push-storeys", "steel-frame-2-storey", [](CDBDoc& doc) {
                 return Pushed<CPushOverStoreyDlg>(doc, 0.6);
             })};

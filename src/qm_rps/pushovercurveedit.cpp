@@ -10,6 +10,7 @@
 #include "qm_rps/pushovercomparisondlg.h"
 #include "qm_rps/pushovercontroldlg.h"
 #include "qm_rps/pushoverhingestatedlg.h"
+#include "qm_rps/pushoverjudgementdlg.h"
 #include "qm_rps/pushovertextdlg.h"
 
 using zql::lib::MMSGFunction;
@@ -291,24 +292,39 @@ void CPushOverCurveEdit::Pushing(const PUSHING_FN& pushing) const
         pushing({});
 }
 
-int CPushOverCurveEdit::OnHinges()
+template <class DIALOG, class FILL>
+int CPushOverCurveEdit::ShowAtPoints(FILL fill)
 {
-    CPushOverHingeStateDlg states(m_doc);
+    DIALOG dialog(m_doc);
     std::string why;
     int done = 0;
     if (Update())
-        Pushing([&](const PUSH_PROGRESS_FN& progress) {
-            done = states.OnShowPoints(m_shown.Result(), progress, why);
-        });
+        Pushing([&](const PUSH_PROGRESS_FN& progress) { done = fill(dialog, progress, why); });
     else
         why = m_shown.Refused();
     if (!done) {
         ShowMessage("IDS_QM_UI_PUSH_POINTS_NONE", why);
         return 0;
     }
-    states.SetView(View());
-    (void)states.DoModal();
+    dialog.SetView(View());
+    (void)dialog.DoModal();
     return 1;
+}
+
+int CPushOverCurveEdit::OnHinges()
+{
+    return ShowAtPoints<CPushOverHingeStateDlg>(
+        [this](auto& states, const PUSH_PROGRESS_FN& progress, std::string& why) {
+            return states.OnShowPoints(m_shown.Result(), progress, why);
+        });
+}
+
+int CPushOverCurveEdit::OnJudge()
+{
+    return ShowAtPoints<CPushOverJudgementDlg>(
+        [this](auto& judged, const PUSH_PROGRESS_FN& progress, std::string& why) {
+            return judged.OnJudge(m_shown.Result(), progress, why);
+        });
 }
 
 void CPushOverCurveEdit::OnCurveText()

@@ -77,6 +77,8 @@ public:
     void OnCurveText();
     /// The hinges at the points of the result, in their window. 0 with a message why not.
     int OnHinges();
+    /// Every member end judged at them, likewise.
+    int OnJudge();
     /// Every method on the load case and spectrum of the settings.
     void OnCompare();
     /// Asks for the name of a file of the kind that the filter (a key) names; empty: cancelled.
@@ -107,6 +109,9 @@ private:
     int Say(const char* key);
     int SayRefusal();
     void Pushing(const PUSHING_FN& pushing) const;
+    /// A window at the points of the result, which `fill` pushes to. 0 with a message why not.
+    template <class DIALOG, class FILL>
+    int ShowAtPoints(FILL fill);
     void ShowText(const char* titleKey, std::string text);
 
     CDBDoc& m_doc;

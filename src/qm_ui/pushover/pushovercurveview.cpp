@@ -260,6 +260,7 @@ void BuildButtons(CFormView& form, MODEL& m)
     QWidget* const host = form.Host();
     const T_BUTTON buttons[] = {
         {"IDS_QM_UI_PUSH_POINTS_HINGES", "hinges", [&m] { (void)m.OnHinges(); }},
+        {"IDS_QM_UI_JUDGE", "judge", [&m] { (void)m.OnJudge(); }},
         {"IDS_QM_UI_PUSH_REPORT", "report", [&m] { m.OnPushoverCurveTextout(); }},
         {"IDS_QM_UI_PUSH_CURVE_FILE", "curveFile", [&m] { m.OnCurveText(); }},
         {"IDS_QM_UI_PUSH_PICTURE", "picture", [&m] { OnGraphExport(m); }},
