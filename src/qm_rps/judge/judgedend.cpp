@@ -82,6 +82,14 @@ std::optional<T_EN_ROTATIONS> RotationsOf(const T_RC_END& member, bool positive,
     return EnRotations(in, sheet);
 }
 
+/// A free or pinned end turns without being bent.
+bool IsWithoutMoment(const T_RC_END& member, const T_END_STATE& s)
+{
+    constexpr double kNothing = 1e-6;
+    const double V = std::fabs(s.V);
+    return s.flowed == 0.0 && V > 0.0 && std::fabs(s.M) <= kNothing * V * member.clear;
+}
+
 void ChordRotations(const T_JUDGED_END& end, const T_END_STATE& s, T_END_CHECKS& out)
 {
     CCodeSheet sheet;
@@ -92,8 +100,11 @@ void ChordRotations(const T_JUDGED_END& end, const T_END_STATE& s, T_END_CHECKS&
         out.whyNoRotation = FaultOf(sheet);
         return;
     }
-    const double theta = sheet.Put("theta", std::fabs(s.chord), "EN 1998-3 A.3.1",
-                                   "rotation of the end less that of the chord", K);
+    const bool isFree = IsWithoutMoment(member, s);
+    const double theta = sheet.Put("theta", isFree ? 0.0 : std::fabs(s.chord), "EN 1998-3 A.3.1",
+                                   isFree ? "no moment: the end is not bent"
+                                          : "rotation of the end less that of the chord",
+                                   K);
     const T_CHORD_LIMITS& limits = found->limits;
     const std::array<double, kLevels> capacity{limits.DL, limits.SD, limits.NC};
     for (std::size_t i = 0; i < kLevels; ++i)

@@ -148,6 +148,17 @@ TEST(Judgement, ShearSpanStaysWithinTheMember)
     }
 }
 
+// The top of a cantilever turns without being bent; a hinge that has lost its moment was.
+TEST(Judgement, FreeEndHasNoRotationDemand)
+{
+    T_END_STATE s = State(0.03, 60.0 * kN);
+    s.M = 1e-9;
+    s.flowed = 0.0;
+    EXPECT_EQ(0.0, Checked(Column(HINGE_CODE::En1998), s).rotation[2]->demand);
+    s.flowed = 0.02;
+    EXPECT_EQ(0.03, Checked(Column(HINGE_CODE::En1998), s).rotation[2]->demand);
+}
+
 // The base reaction peaks in state 2 of 4. By the Circolare shear comes from there in state 3, by
 // EN 1998-3 never; before the peak from the state itself by both.
 TEST(Judgement, CircolareReadsShearAtThePeakWhereThatComesBefore)
