@@ -16,6 +16,9 @@ namespace {
 using zql::lib::MMSGFunction;
 using T_BY_COMPONENT = std::array<T_SIDES<double>, 6>;
 
+constexpr const char* kNoAxial = "IDS_QM_HINGE_NO_AXIAL";
+constexpr const char* kAxialBeyond = "IDS_QM_HINGE_AXIAL_BEYOND";
+
 /// why: in place of the text of the key.
 int Refuse(int element, const std::string& key, T_HINGE_REFUSAL& refusal, std::string why = {})
 {
@@ -67,7 +70,7 @@ int PutMoments(const T_HINGE_ELEMENT& e, const T_UNITS& units, HINGE_COMPONENT c
                                          positive, axial, positive ? moments->pos : moments->neg,
                                          fault))
             continue;
-        refusal.key = "IDS_QM_HINGE_AXIAL_BEYOND";
+        refusal.key = kAxialBeyond;
         refusal.why = MMSGFunction::Format(refusal.key,
                                            {HingeHead(FormatText("%.6g", axial), kDimForce, units),
                                             FormatText("%.6g", -result.strength.level.tension),
@@ -225,8 +228,7 @@ int CHingeGenerator::AxialOf(int axialCase, int element, T_ENDS<double>& out,
     std::string reason;
     if (fresh && !at->second.Analyse(m_doc.Data().Model(), reason, axialCase)) {
         m_axial.erase(at);
-        return Refuse(element, "IDS_QM_HINGE_NO_AXIAL", refusal,
-                      MMSGFunction::Format("IDS_QM_HINGE_NO_AXIAL", {reason}));
+        return Refuse(element, kNoAxial, refusal, MMSGFunction::Format(kNoAxial, {reason}));
     }
     const T_ENDS<double> axial = at->second.Of(element);
     out = {m_doc.Unit().Out(axial.I, kDimForce), m_doc.Unit().Out(axial.J, kDimForce)};
@@ -297,9 +299,12 @@ std::string CHingeGenerator::StaleText(const T_PHGE_D& hinge) const
     T_PHGE_D today;
     T_HINGE_REFUSAL refusal;
     std::string text;
-    if (!HasStrengths(hinge) ||
-        !CalcHinge(hinge.hingeType, hinge.element, today, refusal, hinge.axialCase))
-        return text;
+    if (!HasStrengths(hinge)) return text;
+    if (!CalcHinge(hinge.hingeType, hinge.element, today, refusal, hinge.axialCase)) {
+        // What else is wrong with the element is told as such.
+        const bool axial = refusal.key == kNoAxial || refusal.key == kAxialBeyond;
+        return axial ? refusal.why : text;
+    }
     Compare("", hinge.yield, today.yield, text);
     Compare("", hinge.crack, today.crack, text);
     Compare("J ", hinge.yieldJ, today.yieldJ, text);

@@ -146,6 +146,7 @@ CPushPath::WAY CPushPath::Settle(double control, T_FAULT& fault)
         if (const WAY way = Give(worst, fault); way != WAY::On) return way;
     }
     if (worst != none) return WAY::None;
+    SumUp(); // what is watched has stood still
     if ((fault = Rebuild()) || (fault = Correct(control))) return WAY::Fault;
     return IsAdmitted() ? WAY::On : WAY::None;
 }
@@ -192,10 +193,23 @@ CPushPath::WAY CPushRun::Leap(const T_PUSH_STAGE& stage, int number, T_PUSH_END&
     if (way != WAY::On || m_cancelled) return way;
     m_hasLept = true;
     m_far = target.value;
+    m_peak.reaction = std::max(m_peak.reaction, m_sign * Reaction(stage));
     if ((fault = Store(stage, number, target.additional, end))) return WAY::Fault;
     ++m_target;
     m_path->SetDrive({T_PUSH_DRIVE::KIND::Control, m_sign, {}});
     return WAY::On;
+}
+
+/// A stop that was asked for lies behind the leap, or right where it has led to.
+bool CPushRun::StopsBehindLeap(const T_PUSH_STAGE& stage, int number, T_PUSH_END& end)
+{
+    T_PUSH_END stop;
+    if (!StopsAtHinge(stage.stops, stop) && ToStop(stage, stop) > 0.0) return false;
+    NoteEvent(number);
+    end.outcome = stop.outcome;
+    end.hinge = stop.hinge;
+    end.drift = stop.drift;
+    return true;
 }
 
 } // namespace solver

@@ -309,6 +309,8 @@ CPushRun::T_FAULT CPushRun::Follow(const T_PUSH_STAGE& stage, int number, T_PUSH
             const CPushPath::WAY lept = Leap(stage, number, end, fault);
             if (lept == CPushPath::WAY::Fault) return fault;
             if (m_cancelled) return finish(end.outcome);
+            if (lept == CPushPath::WAY::On && StopsBehindLeap(stage, number, end))
+                return finish(end.outcome);
             if (lept == CPushPath::WAY::On) continue;
         }
         if (found == CPushPath::WAY::None || (byLoad && !m_path->LoadGrows()))

@@ -51,6 +51,7 @@ private:
     T_FAULT Update(const T_PUSH_STAGE& stage, std::optional<double> control);
     T_FAULT Approach(const T_PUSH_STAGE& stage, double by);
     CPushPath::WAY Leap(const T_PUSH_STAGE& stage, int number, T_PUSH_END& end, T_FAULT& fault);
+    bool StopsBehindLeap(const T_PUSH_STAGE& stage, int number, T_PUSH_END& end);
     T_FAULT Flush(T_PUSH_END& end);
 
     const T_PUSH_MODEL& m_model;
@@ -86,7 +87,7 @@ private:
     };
     std::vector<T_KEPT> m_kept; // of the steps that were handed on
     bool m_cancelled = false;
-    bool m_hasLept = false; // in this stage
+    bool m_hasLept = false; // here, or in a stage before
     std::size_t m_eventCount = 0;
 };
 

@@ -46,7 +46,6 @@ void CPushRun::MakeTargets(const T_PUSH_STAGE& stage)
     m_peak = {};
     m_far = m_start;
     m_stored = 0.0;
-    m_hasLept = false;
     m_storedAt.reset();
     m_targets.clear();
     m_target = 0;
