@@ -1,6 +1,8 @@
-// The arguments of the commands on hinge types and pushover load cases.
+// The arguments of the commands on sections, hinge types and pushover load cases.
 #include "hinge/generatehinges.h"
+#include "hinge/sectionbars.h"
 #include "hingecommands.h"
+#include "qm_rps/section/barlayout.h"
 #include "registershared.h"
 #include "registrations.h"
 
@@ -110,6 +112,32 @@ void AddHingeCommands(CLI::App& app, EXIT_CODE& code)
     plot->add_flag("--box", o->box, Say("IDS_QM_HELP_HINGE_BOX"));
     plot->add_option("-o", o->out, Say("IDS_QM_HELP_HINGE_PICTURE"))->required();
     AddOverwrite(plot, o->overwrite);
+}
+
+void AddSectionBars(CLI::App& section, EXIT_CODE& code)
+{
+    const T_GROUP group{&section, "examples/rc-frame-code-hinges/case.json", code};
+    const auto o = std::make_shared<T_SECTION_BARS_OPTIONS>();
+    const auto common = [&](CLI::App* sub, const char* out) {
+        sub->add_option("--section", o->section, Say("IDS_QM_HELP_SECTION_NAME"))->required();
+        sub->add_option("-o", o->out, Say(out))->required();
+        AddOverwrite(sub, o->overwrite);
+    };
+    auto* bars =
+        AddOne(group, "bars", Say("IDS_QM_HELP_SECTION_BARS"),
+               " --section \"column 40x40\" --corners 0.02 --top 1x0.016 --bottom 1x0.016 -o "
+               "bars.json",
+               o, RunSectionBars);
+    common(bars, "IDS_QM_HELP_TO_WRITE");
+    constexpr std::array<const char*, 6> kHelp{
+        "IDS_QM_HELP_BARS_CORNERS", "IDS_QM_HELP_BARS_TOP",  "IDS_QM_HELP_BARS_BOTTOM",
+        "IDS_QM_HELP_BARS_RIGHT",   "IDS_QM_HELP_BARS_LEFT", "IDS_QM_HELP_BARS_AROUND"};
+    for (std::size_t i = 0; i < kHelp.size(); ++i)
+        bars->add_option(std::string("--") + kBarPlaceNames[i], o->bars[i], Say(kHelp[i]));
+    bars->add_flag("--keep", o->keep, Say("IDS_QM_HELP_BARS_KEEP"));
+    common(AddOne(group, "plot", Say("IDS_QM_HELP_SECTION_PLOT"),
+                  " --section \"column 40x40\" -o section.svg", o, RunSectionPlot),
+           "IDS_QM_HELP_HINGE_PICTURE");
 }
 
 void AddCase(CLI::App& app, EXIT_CODE& code)

@@ -21,6 +21,9 @@ std::string MeantWord(const CLI::App& program, std::span<const char* const> word
 void AddModel(CLI::App& app, EXIT_CODE& code);
 void AddEvaluations(CLI::App& app, EXIT_CODE& code);
 void AddHingeCommands(CLI::App& app, EXIT_CODE& code);
+void AddSection(CLI::App& app, EXIT_CODE& code);
+/// Commands below "section".
+void AddSectionBars(CLI::App& section, EXIT_CODE& code);
 void AddCase(CLI::App& app, EXIT_CODE& code);
 void AddAnalyse(CLI::App& app, EXIT_CODE& code);
 void AddUlf(CLI::App& app, EXIT_CODE& code);

@@ -4,6 +4,7 @@
 #include "loadcasetools.h"
 #include "pushovertools.h"
 #include "pushtools.h"
+#include "structuretools.h"
 #include "ulftools.h"
 
 void RegisterViews(CViewFactory& factory)
@@ -11,6 +12,7 @@ void RegisterViews(CViewFactory& factory)
     RegisterPushViews(factory);
     RegisterPushoverViews(factory);
     RegisterLoadCaseViews(factory);
+    RegisterStructureViews(factory);
     RegisterHingeViews(factory);
     RegisterUlfViews(factory);
 }
@@ -20,13 +22,14 @@ T_COMMANDS ToolCommands(T_DESKTOP& desktop)
     T_COMMANDS all;
     for (const T_COMMANDS& part :
          {PushCommands(desktop), PushoverCommands(desktop), LoadCaseCommands(desktop),
-          HingeCommands(desktop), UlfCommands(desktop)})
+          StructureCommands(desktop), HingeCommands(desktop), UlfCommands(desktop)})
         all.insert(all.end(), part.begin(), part.end());
     return all;
 }
 
 void OpenRecord(T_DESKTOP& desktop, EXPLORER_TABLE table, int key)
 {
-    for (const auto open : {OpenPushoverRecord, OpenLoadCaseRecord, OpenHingeRecord, OpenUlfRecord})
+    for (const auto open : {OpenPushoverRecord, OpenLoadCaseRecord, OpenStructureRecord,
+                            OpenHingeRecord, OpenUlfRecord})
         if (open(desktop, table, key)) return;
 }

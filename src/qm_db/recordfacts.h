@@ -5,6 +5,7 @@
 #include "qm_db/records/evaluationrules.h"
 #include "qm_db/records/hingenames.h"
 #include "qm_db/records/loadcaserules.h"
+#include "qm_db/records/modelfault.h"
 #include "qm_db/records/pushcontrol.h"
 #include "qm_db/records/pushnames.h"
 #include "qm_db/records/storeyrules.h"

@@ -2,6 +2,7 @@
 // tests/oracle/codehinges.py, which shares no line with the program.
 #include "program.h"
 
+#include <algorithm>
 #include <cmath>
 
 namespace {
@@ -164,6 +165,47 @@ TEST_F(CodeHinges, ComeBackFromBothFilesAndTellWhatHasChanged)
     const json again = Json("hinge generate stale.json --code ASCE41-17 --all -o again.json");
     EXPECT_EQ(2u, json::parse(Text("again.json")).at("hinge_types").size());
     EXPECT_EQ(std::string::npos, Done("hinge check again.json").find("generated"));
+}
+
+/// Bars of a section, sorted.
+std::vector<std::array<double, 3>> BarsOf(const json& file, std::size_t section)
+{
+    std::vector<std::array<double, 3>> bars;
+    for (const json& bar : file.at("sections").at(section).at("bars"))
+        bars.push_back({bar.at("y"), bar.at("z"), bar.at("area")});
+    std::ranges::sort(bars);
+    return bars;
+}
+
+TEST_F(CodeHinges, BarsOfASectionAreLaidByARule)
+{
+    const json byHand = Case();
+    json bare = byHand;
+    bare["sections"][0].erase("bars");
+    Write("c.json", bare.dump(1));
+    ExpectHolds(Done("section bars c.json --section column --around 8x0.018 -o b.json"),
+                {"8 bars, 0.0020358 m2: 1.27 %"});
+    const auto expected = BarsOf(byHand, 0), laid = BarsOf(json::parse(Text("b.json")), 0);
+    ASSERT_EQ(expected.size(), laid.size());
+    for (std::size_t i = 0; i < laid.size(); ++i)
+        for (std::size_t k = 0; k < 3; ++k)
+            EXPECT_NEAR(expected[i][k], laid[i][k], 1e-9) << i;
+    (void)Done("section bars b.json --section column --keep --top 2x0.01 -o more.json");
+    EXPECT_EQ(10U, BarsOf(json::parse(Text("more.json")), 0).size());
+    const std::pair<const char*, const char*> bad[] = {
+        {"--section column --around 7x0.018", "even"},
+        {"--section column --corners 4x0.018", "diameter alone"},
+        {"--section column --top 0.018", "number x diameter"},
+        {"--section column", "say which bars"},
+        {"--section none --corners 0.018", "no section \"none\""}};
+    for (const auto& [arguments, says] : bad)
+        (void)ExpectRefused(std::string("section bars b.json ") + arguments + " -o no.json", 2,
+                            says);
+    EXPECT_EQ("", Text("no.json"));
+#ifdef QM_UI
+    (void)Done("section plot b.json --section column -o s.svg");
+    ExpectHolds(Text("s.svg"), {"stirrup", "8 bars"});
+#endif
 }
 
 TEST_F(CodeHinges, AreRefusedWithTheMemberAndTheReason)

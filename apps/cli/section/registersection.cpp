@@ -94,4 +94,5 @@ void AddSection(CLI::App& app, EXIT_CODE& code)
     AddTask(group, SECTION_TASK::Surface, "IDS_QM_HELP_SECC_SURFACE",
             " --section \"column 40x40\" --axial 0 400 800 --json -");
     AddLibrary(section, code);
+    AddSectionBars(*section, code);
 }

@@ -5,6 +5,7 @@
 #include "mainwindow.h"
 #include "pushovertools.h"
 #include "pushtools.h"
+#include "structuretools.h"
 #include "ulftools.h"
 
 std::vector<T_WINDOW_EXAMPLE> WindowExamples()
@@ -27,7 +28,7 @@ std::vector<T_WINDOW_EXAMPLE> WindowExamples()
                                       {"main-bridge", "cable-stayed-bridge", shown(KIND::Static)},
                                       {"main-space", "space-frame-3d", shown(KIND::Static)}};
     for (auto& part : {PushWindowExamples(), PushoverWindowExamples(), LoadCaseWindowExamples(),
-                       HingeWindowExamples(), UlfWindowExamples()})
+                       StructureWindowExamples(), HingeWindowExamples(), UlfWindowExamples()})
         all.insert(all.end(), part.begin(), part.end());
     return all;
 }

@@ -20,10 +20,14 @@ public:
     template <class T>
     using Ref = const T&;
 
-    const std::string& Fault() const { return m_fault; }
+    std::string Fault() const { return m_words.empty() ? "" : m_member + ": " + m_words; }
+    const std::string& Member() const { return m_member; }
+    const std::string& Words() const { return m_words; } // empty: all rules are kept
     void Fail(std::string_view key, const std::string& words)
     {
-        if (m_fault.empty()) m_fault = m_place + std::string(key) + ": " + words;
+        if (!m_words.empty()) return;
+        m_member = m_place + std::string(key);
+        m_words = words;
     }
 
     template <class T>
@@ -224,7 +228,7 @@ private:
         Fail(key, Say("IDS_QM_JSON_CHOICE", Say(what), '"' + found + '"', all));
     }
 
-    std::string m_fault;
+    std::string m_member, m_words;
     std::string m_place;    // of what the members are in
     std::string_view m_key; // of the member that was met last
     std::set<std::string_view> m_left;
@@ -284,7 +288,36 @@ private:
     std::string m_fault;
 };
 
+template <class R>
+std::vector<T_FINDING> FindingsOf(const T_TABLE<R>& table, const R& record, int key)
+{
+    CFieldJudge judge;
+    const char* const reason = NameFault(record.name);
+    judge.Rule("name", !reason, reason ? reason : "");
+    for (const auto& [other, taken] : table)
+        if (other != key && taken.name == record.name)
+            judge.Fail("name", Say("IDS_QM_JSON_TWICE", '"' + record.name + '"'));
+    CaseFields(judge, record);
+    if (judge.Words().empty()) return {};
+    T_FINDING finding;
+    finding.field = judge.Member();
+    finding.ruleText = judge.Member();
+    finding.messageKey = "IDS_QM_DB_RECORD_FAULT";
+    finding.text = Say(finding.messageKey, judge.Member(), judge.Words());
+    return {finding};
+}
+
 } // namespace
+
+std::vector<T_FINDING> RecordFindings(const T_MODEL& model, const T_SECT_D& record, int key)
+{
+    return FindingsOf(model.sections, record, key);
+}
+
+std::vector<T_FINDING> RecordFindings(const T_MODEL& model, const T_MATL_D& record, int key)
+{
+    return FindingsOf(model.materials, record, key);
+}
 
 std::string ModelFault(const T_MODEL& model)
 {

@@ -1,5 +1,6 @@
 // Tables of the structure: nodes, elements, sections, materials, storeys.
 #include "qm_base/msgfunction.h"
+#include "qm_rps/desk/freename.h"
 #include "qm_rps/desk/recordtable.h"
 #include "qm_rps/desk/recordtables.h"
 
@@ -17,17 +18,6 @@ std::string TextOf(const char* key)
 bool NodeExists(const T_MODEL& model, int id)
 {
     return model.nodes.contains(id);
-}
-
-/// "New 3", a name that no record of the table has.
-template <class R>
-std::string FreeName(const T_TABLE<R>& table, int key)
-{
-    for (int i = key;; ++i) {
-        const std::string name = MMSGFunction::Format("IDS_QM_UI_NEW_NAME", {std::to_string(i)});
-        const auto has = [&](const auto& entry) { return entry.second.name == name; };
-        if (std::none_of(table.begin(), table.end(), has)) return name;
-    }
 }
 
 T_RECORD_COLUMNS<T_NODE_D> NodeColumns()

@@ -1,0 +1,169 @@
+#include "qm_rps/sectiondlg.h"
+
+#include "qm_base/say.h"
+#include "qm_base/textformat.h"
+#include "qm_db/editscope.h"
+#include "qm_db/recordfacts.h"
+#include "qm_db/sectionproperties.h"
+#include "qm_rps/desk/freename.h"
+#include "qm_rps/dialog/unithead.h"
+
+CSectionDlg::CSectionDlg(CDBDoc& doc, int key) : m_doc(doc)
+{
+    const auto& sections = doc.Data().Model().sections;
+    if (key == 0 && !sections.empty()) key = sections.begin()->first;
+    const auto metres = [this](double value) { return FromSi(value, Units(), kDimLength); };
+    m_detail.cover = metres(0.03);
+    m_detail.stirrupDiameter = metres(0.008);
+    m_detail.stirrupSpacing = metres(0.15);
+    m_group.diameter = metres(0.016);
+    Read(key);
+}
+
+void CSectionDlg::Read(int key)
+{
+    T_SECT_D section;
+    m_key = m_doc.Attr().GetSect(key, section) ? key : 0;
+    if (m_key == 0) {
+        const auto& all = m_doc.Data().Model().sections;
+        section.name = FreeName(all, NextKey(all));
+        section.shape = SECT_SHAPE::Rectangle;
+    }
+    m_section = m_read = std::move(section);
+    if (m_section.detailing) m_detail = *m_section.detailing;
+    m_bar = -1;
+}
+
+std::vector<std::string> CSectionDlg::Names() const
+{
+    std::vector<std::string> names;
+    for (const auto& [key, section] : m_doc.Data().Model().sections)
+        names.push_back(section.name);
+    return names;
+}
+
+int CSectionDlg::Index() const
+{
+    const auto& all = m_doc.Data().Model().sections;
+    const auto at = all.find(m_key);
+    return at == all.end() ? -1 : static_cast<int>(std::distance(all.begin(), at));
+}
+
+bool CSectionDlg::MayLeave()
+{
+    constexpr const char* kAsk = "IDS_QM_UI_SECT_KEEP";
+    return m_section == m_read || !AskYesNo(kAsk, Say(kAsk, m_section.name)) || Store();
+}
+
+void CSectionDlg::OnSelChange(int index)
+{
+    const auto& all = m_doc.Data().Model().sections;
+    if (index < 0 || index >= std::ssize(all) || index == Index()) return;
+    const int key = std::next(all.begin(), index)->first;
+    if (MayLeave()) Read(key);
+}
+
+void CSectionDlg::OnNew()
+{
+    if (MayLeave()) Read(0);
+}
+
+void CSectionDlg::OnDetailing(bool on)
+{
+    if (on == HasDetailing()) return;
+    if (!on) m_detail = *m_section.detailing;
+    m_section.detailing = on ? std::optional(m_detail) : std::nullopt;
+}
+
+T_SECT_D CSectionDlg::Calculated() const
+{
+    T_SECT_D out = m_section;
+    SECT_FAULT fault = SECT_FAULT::None;
+    (void)CSectionProperties::Calc(m_section, out, fault); // else as entered
+    return out;
+}
+
+int CSectionDlg::OnAddBars()
+{
+    std::vector<T_REBAR> bars;
+    std::string reason;
+    if (!LayBars(m_section, m_group, bars, reason)) {
+        ShowMessage("IDS_QM_UI_SECT_NO_BARS", Say("IDS_QM_UI_SECT_NO_BARS", reason));
+        return 0;
+    }
+    m_section.bars.insert(m_section.bars.end(), bars.begin(), bars.end());
+    return 1;
+}
+
+void CSectionDlg::OnDeleteBar(int row)
+{
+    if (row < 0 || row >= std::ssize(m_section.bars)) return;
+    m_section.bars.erase(m_section.bars.begin() + row);
+    m_bar = std::min(row, static_cast<int>(std::ssize(m_section.bars)) - 1);
+}
+
+std::string CSectionDlg::CellText(std::size_t row, COLUMN column) const
+{
+    if (row >= m_section.bars.size()) return {};
+    const T_REBAR& bar = m_section.bars[row];
+    const double values[] = {bar.y, bar.z, BarDiameter(bar), bar.area};
+    return column == Diameter ? FormatText("%.6g", values[column]) : ShortestText(values[column]);
+}
+
+int CSectionDlg::SetCell(std::size_t row, COLUMN column, const std::string& text)
+{
+    const std::optional<double> number = ParseFinite(text);
+    if (row >= m_section.bars.size() || !number) return 0;
+    T_REBAR& bar = m_section.bars[row];
+    if (column >= Diameter && *number < 0.0) return 0;
+    if (column == Diameter)
+        bar.area = BarArea(*number);
+    else
+        (column == Y ? bar.y : column == Z ? bar.z : bar.area) = *number;
+    return 1;
+}
+
+std::string CSectionDlg::ColumnHead(COLUMN column) const
+{
+    constexpr T_DIM kArea{0, 2};
+    const std::string heads[] = {"y", "z", Say("IDS_QM_UI_SECT_DIAMETER"),
+                                 Say("IDS_QM_UI_SECT_AREA")};
+    return HeadWithUnit(heads[column], column == Area ? kArea : kDimLength, Units());
+}
+
+std::string CSectionDlg::BarsText() const
+{
+    if (m_section.bars.empty()) return Say("IDS_QM_UI_SECT_BARS_NONE");
+    double area = 0.0;
+    for (const T_REBAR& bar : m_section.bars)
+        area += bar.area;
+    const double gross = Calculated().area;
+    const std::string unit = std::string(NameOf(Units().length)) + "2";
+    const std::string share = gross > 0.0 ? FormatText("%.3g", 100.0 * area / gross) : "-";
+    return Say("IDS_QM_UI_SECT_BARS", std::to_string(m_section.bars.size()),
+               FormatText("%.5g", area) + " " + unit, share);
+}
+
+std::vector<T_FINDING> CSectionDlg::Findings() const
+{
+    return RecordFindings(m_doc.Data().Model(), m_section, m_key);
+}
+
+int CSectionDlg::Store()
+{
+    if (!CheckData()) return 0;
+    const int key = m_key ? m_key : NextKey(m_doc.Data().Model().sections);
+    CEditScope edit(m_doc, m_section.name);
+    if (edit.Put(key, m_section) && edit.Commit()) {
+        m_key = key;
+        m_read = m_section;
+        return 1;
+    }
+    ShowMessage("IDS_QM_UI_EDIT_BUSY");
+    return 0;
+}
+
+int CSectionDlg::OnOK()
+{
+    return m_key != 0 && m_section == m_read ? 1 : Store();
+}
