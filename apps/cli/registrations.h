@@ -31,6 +31,5 @@ void AddPush(CLI::App& app, EXIT_CODE& code);
 /// Commands below "push" and below "case".
 void AddPushSetup(CLI::App& push, EXIT_CODE& code);
 void AddCaseGenerate(CLI::App& cases, EXIT_CODE& code);
-void AddSection(CLI::App& app, EXIT_CODE& code);
 void AddJudge(CLI::App& app, EXIT_CODE& code);
 void AddReport(CLI::App& app, EXIT_CODE& code);

@@ -103,6 +103,14 @@ std::vector<T_ENTRY> Entries(const T_FRAME_PICTURE& picture, const T_FRAME_OPTIO
                            p.fillRect(QRectF(m.x() - 5, m.y() - 3, 10, 6), kSupportColor);
                        }});
     if (picture.bands) AddBands(*picture.bands, out);
+    const auto chosen = std::ranges::count(picture.chosen, true);
+    if (chosen > 0)
+        out.push_back({QString::fromStdString(MMSGFunction::Format("IDS_QM_UI_FRAME_CHOSEN",
+                                                                   {std::to_string(chosen)})),
+                       [](QPainter& p, QPointF m) {
+                           p.setPen(QPen(kChosenColor, 7.0, Qt::SolidLine, Qt::RoundCap));
+                           p.drawLine(m - QPointF(8, 0), m + QPointF(8, 0));
+                       }});
     if (options.hinges && picture.marks) AddStates(*picture.marks, out);
     const bool hinged = !picture.marks && std::ranges::any_of(scene.lines, [](const auto& l) {
         return l.hingeI || l.hingeJ;

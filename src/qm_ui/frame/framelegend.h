@@ -8,6 +8,7 @@
 
 inline const QColor kSupportColor{0x37, 0x47, 0x4f};
 inline const QColor kHingeColor{0xef, 0x6c, 0x00};
+inline const QColor kChosenColor{0xff, 0xd5, 0x4f};
 
 /// Pen of the lines of a kind of elements; faint: of the frame as it was.
 QPen FramePen(ELEM_KIND kind, bool faint, bool thick);

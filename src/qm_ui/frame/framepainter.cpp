@@ -140,6 +140,18 @@ void CFramePainter::DrawBands(QPainter& painter, const T_FRAME_PICTURE& picture)
     }
 }
 
+/// A broad line below the one that is there.
+void CFramePainter::DrawChosen(QPainter& painter, const T_FRAME_PICTURE& picture)
+{
+    const auto& lines = picture.scene->lines;
+    m_lines.clear();
+    for (std::size_t l = 0; l < lines.size() && l < picture.chosen.size(); ++l)
+        if (picture.chosen[l]) m_lines.emplace_back(m_moved[lines[l].i], m_moved[lines[l].j]);
+    if (m_lines.empty()) return;
+    painter.setPen(QPen(kChosenColor, 7.0, Qt::SolidLine, Qt::RoundCap));
+    painter.drawLines(m_lines.data(), static_cast<int>(m_lines.size()));
+}
+
 /// Of a model without elements, whose results came from another solver.
 void CFramePainter::DrawNodes(QPainter& painter) const
 {
@@ -260,6 +272,7 @@ void CFramePainter::DrawForeground(QPainter& painter, const QRectF& rect,
     }
     PlaceMoved(picture, camera);
     painter.setRenderHint(QPainter::Antialiasing, scene.lines.size() <= kSmooth);
+    DrawChosen(painter, picture);
     DrawLines(painter, scene, m_moved, false);
     if (picture.bands) DrawBands(painter, picture);
     painter.setRenderHint(QPainter::Antialiasing, true);
@@ -306,6 +319,34 @@ long CFramePainter::HingeAt(QPointF place) const
         nearest = static_cast<long>(*m);
     }
     return nearest;
+}
+
+long CFramePainter::LineAt(const T_FRAME_SCENE& scene, QPointF place) const
+{
+    long nearest = -1;
+    double distance = kHit;
+    for (std::size_t l = 0; l < scene.lines.size(); ++l) {
+        const QPointF a = m_moved.at(scene.lines[l].i), b = m_moved.at(scene.lines[l].j);
+        const QPointF along = b - a, from = place - a;
+        const double square = QPointF::dotProduct(along, along);
+        const double t =
+            square > 0.0 ? std::clamp(QPointF::dotProduct(from, along) / square, 0.0, 1.0) : 0.0;
+        const double d = QLineF(place, a + t * along).length();
+        if (d >= distance) continue;
+        distance = d;
+        nearest = static_cast<long>(l);
+    }
+    return nearest;
+}
+
+std::vector<std::size_t> CFramePainter::LinesIn(const T_FRAME_SCENE& scene, const QRectF& box) const
+{
+    std::vector<std::size_t> lines;
+    for (std::size_t l = 0; l < scene.lines.size(); ++l)
+        if (box.contains(m_moved.at(scene.lines[l].i)) &&
+            box.contains(m_moved.at(scene.lines[l].j)))
+            lines.push_back(l);
+    return lines;
 }
 
 const T_CAMERA& CameraFor(int flatAxis)

@@ -48,6 +48,7 @@ struct T_FRAME_PICTURE {
     std::vector<T_SCENE_DRIFT> drifts;
     const T_HINGE_MARKS* marks = nullptr; // hinges by their states; null: in one colour
     const T_RATIO_BANDS* bands = nullptr; // ends of members by their ratios; null: none
+    std::vector<bool> chosen{};           // by line: those that are marked; empty: none
 };
 
 /// Lengths are px at 96 dpi. State: buffers that are used again for the next picture.
@@ -67,6 +68,11 @@ public:
     [[nodiscard]] long NodeAt(QPointF place) const;
     /// The hinge of its marks, likewise; of several at one place the one whose state is worst.
     [[nodiscard]] long HingeAt(QPointF place) const;
+    /// The nearest line, likewise.
+    [[nodiscard]] long LineAt(const T_FRAME_SCENE& scene, QPointF place) const;
+    /// Lines with both ends in a box.
+    [[nodiscard]] std::vector<std::size_t> LinesIn(const T_FRAME_SCENE& scene,
+                                                   const QRectF& box) const;
 
 private:
     void PlaceDesign(const T_FRAME_PICTURE& picture, const T_CAMERA& camera, const QRectF& area);
@@ -76,6 +82,7 @@ private:
     void DrawBands(QPainter& painter, const T_FRAME_PICTURE& picture) const;
     void DrawNodes(QPainter& painter) const;
     void DrawSupports(QPainter& painter, const T_FRAME_SCENE& scene) const;
+    void DrawChosen(QPainter& painter, const T_FRAME_PICTURE& picture);
     void DrawHinges(QPainter& painter, const T_FRAME_SCENE& scene) const;
     void DrawMarks(QPainter& painter, const T_FRAME_PICTURE& picture);
     void DrawNumbers(QPainter& painter, const QRectF& area, const T_FRAME_PICTURE& picture,

@@ -11,6 +11,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <utility>
 
 namespace {
 
@@ -57,6 +58,7 @@ CFrameView::T_KEPT CFrameView::Key() const
             lines,
             !m_picture.drifts.empty(),
             m_picture.marks != nullptr,
+            std::ranges::count(m_picture.chosen, true),
             m_camera,
             m_options,
             size()};
@@ -76,6 +78,14 @@ void CFrameView::paintEvent(QPaintEvent*)
     QPainter painter(this);
     painter.drawPixmap(0, 0, m_background);
     m_painter.DrawForeground(painter, area, m_picture, m_camera, m_options);
+    if (!m_isBox) return;
+    painter.setPen(QPen(palette().color(QPalette::Highlight), 1.0, Qt::DashLine));
+    painter.drawRect(Box());
+}
+
+QRectF CFrameView::Box() const
+{
+    return QRectF(m_press, m_grab).normalized();
 }
 
 QString CFrameView::ReadOut(QPointF place) const
@@ -101,6 +111,8 @@ QString CFrameView::ReadOut(QPointF place) const
 void CFrameView::mousePressEvent(QMouseEvent* event)
 {
     m_grab = m_press = event->position();
+    m_isBox = m_onLines && event->button() == Qt::LeftButton &&
+              event->modifiers().testFlag(Qt::ControlModifier);
 }
 
 long CFrameView::HingeAt(QPointF place) const
@@ -108,15 +120,27 @@ long CFrameView::HingeAt(QPointF place) const
     return m_picture.marks ? m_painter.HingeAt(place) : -1;
 }
 
+long CFrameView::LineAt(QPointF place) const
+{
+    return m_picture.scene ? m_painter.LineAt(*m_picture.scene, place) : -1;
+}
+
 /// A click, where the mouse has not moved.
 void CFrameView::mouseReleaseEvent(QMouseEvent* event)
 {
     constexpr double kStill = 3.0; // px
-    if (!m_onHinge || event->button() != Qt::LeftButton ||
-        QLineF(m_press, event->position()).length() > kStill)
+    const bool isBox = std::exchange(m_isBox, false);
+    if (event->button() != Qt::LeftButton) return;
+    if (QLineF(m_press, event->position()).length() > kStill) {
+        m_grab = event->position();
+        update();
+        if (isBox && m_picture.scene) m_onLines(m_painter.LinesIn(*m_picture.scene, Box()));
         return;
-    const long hinge = HingeAt(event->position());
-    if (hinge >= 0) m_onHinge(hinge);
+    }
+    const long hinge = m_onHinge ? HingeAt(event->position()) : -1;
+    if (hinge >= 0) return m_onHinge(hinge);
+    const long line = m_onLine ? LineAt(event->position()) : -1;
+    if (line >= 0) m_onLine(static_cast<std::size_t>(line));
 }
 
 void CFrameView::Turn(double yawDeg, double pitchDeg)
@@ -135,6 +159,7 @@ void CFrameView::mouseMoveEvent(QMouseEvent* event)
         return;
     }
     m_grab = event->position();
+    if (m_isBox) return update();
     if (event->buttons().testFlag(Qt::LeftButton) && !shift)
         return Turn(-kDegPerPx * by.x(), kDegPerPx * by.y());
     m_camera.pan += by;

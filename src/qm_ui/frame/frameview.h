@@ -10,7 +10,8 @@
 #include <functional>
 
 /// Left drag turns, right or middle drag (or left with Shift) moves, the wheel zooms at the cursor,
-/// a double click fits. Arrow keys turn, + and - zoom, 0 fits; 1 to 4 isometric, XZ, YZ, XY.
+/// a double click fits. Where lines can be chosen a click takes the nearest one, and left drag with
+/// Ctrl those in a box. Arrow keys turn, + and - zoom, 0 fits; 1 to 4 isometric, XZ, YZ, XY.
 class CFrameView : public QWidget {
 public:
     explicit CFrameView(QWidget* parent = nullptr);
@@ -24,8 +25,13 @@ public:
     const T_FRAME_OPTIONS& Options() const { return m_options; }
     /// A hinge of the picture's marks was clicked.
     std::function<void(long hinge)> m_onHinge;
+    /// A line of the scene was clicked; lines with both ends in a box that was drawn.
+    std::function<void(std::size_t line)> m_onLine;
+    std::function<void(const std::vector<std::size_t>& lines)> m_onLines;
     /// The hinge of the picture's marks at a place, as it was drawn last; -1: none.
     [[nodiscard]] long HingeAt(QPointF place) const;
+    /// The line of the scene at a place, likewise.
+    [[nodiscard]] long LineAt(QPointF place) const;
     /// Id and coordinates of the node under a place; empty: none.
     [[nodiscard]] QString ReadOut(QPointF place) const;
 
@@ -44,6 +50,7 @@ protected:
 private:
     void ZoomAt(QPointF place, double factor);
     void Turn(double yawDeg, double pitchDeg);
+    QRectF Box() const;
 
     T_FRAME_PICTURE m_picture;
     T_CAMERA m_camera;
@@ -56,6 +63,7 @@ private:
         bool moved = false;
         std::size_t lines = 0; // titles that are shown: they move the frame
         bool drifts = false, marks = false;
+        std::ptrdiff_t chosen = 0;
         T_CAMERA camera;
         T_FRAME_OPTIONS options;
         QSize size;
@@ -65,4 +73,5 @@ private:
     T_KEPT m_kept;
     QPixmap m_background;
     QPointF m_grab, m_press;
+    bool m_isBox = false; // a box is being drawn from m_press to m_grab
 };
