@@ -15,11 +15,11 @@ void AddGenerate(CLI::App* hinge, EXIT_CODE& code)
     auto* sub = AddOne(group, "generate", Say("IDS_QM_HELP_HINGE_GENERATE"),
                        " --code ASCE41-17 --all -o generated.json", o, RunHingeGenerate);
     sub->add_option("--code", o->code, Say("IDS_QM_HELP_HINGE_CODE"))
-        ->required()
         ->check(CLI::IsMember(
             std::vector<std::string>(kHingeCodeNames.begin(), kHingeCodeNames.end())));
     sub->add_option("--elements", o->elements, Say("IDS_QM_HELP_HINGE_ELEMENTS"));
     sub->add_flag("--all", o->all, Say("IDS_QM_HELP_HINGE_ALL"));
+    sub->add_flag("--stale", o->stale, Say("IDS_QM_HELP_HINGE_STALE"));
     sub->add_option("--level", o->level, Say("IDS_QM_HELP_HINGE_LEVEL"))
         ->check(CLI::IsMember({"primary", "secondary"}));
     sub->add_option("--push", o->push, Say("IDS_QM_HELP_HINGE_PUSH"));

@@ -161,6 +161,17 @@ TEST_F(CodeHinges, ComeBackFromBothFilesAndTellWhatHasChanged)
     ExpectHolds(Done("hinge check stale.json"),
                 {"column 1", "stale: section, material, member or initial loads of element 1",
                  "beam 1", "generated, and edited since"});
+    // The stale one alone is made again, by its own code; the edited one stays.
+    const json fresh = Json("hinge generate stale.json --stale -o fresh.json");
+    ASSERT_EQ(1U, fresh.at("types").size());
+    EXPECT_EQ("ASCE41-17", fresh.at("code"));
+    EXPECT_EQ(json::array({1}), fresh["types"][0]["elements"]);
+    const std::string said = Done("hinge check fresh.json");
+    EXPECT_EQ(std::string::npos, said.find("stale: section")) << said;
+    ExpectHolds(said, {"generated, and edited since"});
+    ExpectHolds(Done("hinge generate fresh.json --stale -o none.json"), {"0 elements"});
+    (void)ExpectRefused("hinge generate stale.json --stale --all -o no.json", 2, "--stale");
+    (void)ExpectRefused("hinge generate stale.json --all -o no.json", 2, "--code");
     // Once more: the types of before are replaced, not added to.
     const json again = Json("hinge generate stale.json --code ASCE41-17 --all -o again.json");
     EXPECT_EQ(2u, json::parse(Text("again.json")).at("hinge_types").size());

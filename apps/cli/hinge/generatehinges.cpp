@@ -14,92 +14,44 @@
 
 namespace {
 
-constexpr HINGE_DEFINITION kMeasure = HINGE_DEFINITION::MomentRotation;
-
 std::string Number(double value)
 {
     return FormatText("%.5g", value);
 }
 
-/// a, b, c, IO, LS, CP as plastic deformations; theta_y, DL, SD, NC as total ones.
-void AppendBackbone(const T_CODE_BACKBONE& bone, bool chord, T_DIM dim, const T_UNITS& units,
-                    std::vector<std::string>& cells)
-{
-    const auto put = [&](double value) { cells.push_back(Number(FromSi(value, units, dim))); };
-    if (chord) {
-        put(bone.yieldDeform);
-    } else {
-        put(bone.Plastic(bone.C.deform));
-        put(bone.Plastic(bone.E.deform));
-        cells.push_back(Number(bone.D.strength));
-    }
-    for (const double level : bone.acceptance.value_or(std::array<double, 3>{}))
-        put(chord ? level : bone.Plastic(level));
-}
-
-/// Moments alone: "M (kN m)"; else "F, M (kN, kN m)".
-std::string StrengthHead(const T_CODE_HINGES& hinges, const T_UNITS& units)
-{
-    const std::string moment = UnitText(kDimMoment, units);
-    for (const T_CODE_ELEMENT& element : hinges.elements)
-        for (const T_CODE_COMPONENT& c : element.hinge->components)
-            if (c.component < HINGE_COMPONENT::Mx)
-                return "F, M (" + UnitText(kDimForce, units) + ", " + moment + ")";
-    return "M (" + moment + ")";
-}
-
-std::vector<std::string> Heads(const T_CODE_HINGES& hinges, bool chord, const T_UNITS& units)
-{
-    const std::string force(NameOf(units.force));
-    std::vector<std::string> heads{Say("IDS_QM_CLI_ELEMENT"),
-                                   Say("IDS_QM_GEN_END"),
-                                   Say("IDS_QM_GEN_AXIS"),
-                                   "+/-",
-                                   "N (" + force + ")",
-                                   StrengthHead(hinges, units),
-                                   "V/Vn"};
-    const std::vector<std::string> more =
-        chord ? std::vector<std::string>{"theta_y", "DL", "SD", "NC"}
-              : std::vector<std::string>{"a", "b", "c", "IO", "LS", "CP"};
-    heads.insert(heads.end(), more.begin(), more.end());
-    heads.push_back(Say("IDS_QM_CLI_HINGE_TYPE"));
-    return heads;
-}
-
+/// Plastic rotations and chord rotations have tables of their own.
 std::string Table(const T_CODE_HINGES& hinges, bool chord, const T_UNITS& units)
 {
-    T_TABLE_ROWS table{Heads(hinges, chord, units)};
+    T_TABLE_ROWS table{HingeRowHeads(hinges, chord, units)};
+    table.front().insert(table.front().begin(), Say("IDS_QM_CLI_ELEMENT"));
+    table.front().push_back(Say("IDS_QM_CLI_HINGE_TYPE"));
     for (const T_CODE_ELEMENT& element : hinges.elements)
         for (const T_CODE_ROW_OF_HINGE& row : HingeRows(element)) {
+            if (chord != (row.of->bone.levels == CODE_LEVELS::DlSdNc)) continue;
             std::vector<std::string>& cells = table.emplace_back();
-            cells = {std::to_string(row.element),
-                     row.end,
-                     kComponentNames[static_cast<std::size_t>(row.component)],
-                     row.side,
-                     Number(FromSi(row.axial, units, kDimForce)),
-                     Number(FromSi(row.of->strength, units, StrengthDim(row.component))),
-                     row.of->shearStrength > 0.0 ? Number(row.of->shear / row.of->shearStrength)
-                                                 : "-"};
-            AppendBackbone(row.of->bone, chord, DeformDim(row.component, kMeasure), units, cells);
+            cells = HingeRowCells(row, chord, units);
+            cells.insert(cells.begin(), std::to_string(row.element));
             cells.push_back(element.hinge->type.name);
         }
-    return TableText(table);
+    return table.size() > 1 ? TableText(table) : std::string();
 }
 
-/// The first element of each type: the others have the same numbers.
-std::vector<const T_CODE_ELEMENT*> OfTypes(const T_CODE_HINGES& hinges)
+/// "ASCE41-17", of stale ones maybe several.
+std::string CodesOf(const T_CODE_HINGES& hinges)
 {
-    std::vector<const T_CODE_ELEMENT*> firsts;
-    std::set<const T_CODE_HINGE*> seen;
+    std::set<std::string> codes;
     for (const T_CODE_ELEMENT& element : hinges.elements)
-        if (seen.insert(element.hinge.get()).second) firsts.push_back(&element);
-    return firsts;
+        codes.insert(element.hinge->type.generated->code);
+    std::string text;
+    for (const std::string& code : codes)
+        text += (text.empty() ? "" : ", ") + code;
+    return text;
 }
 
 std::string TraceText(const T_CODE_HINGES& hinges, const T_UNITS& units)
 {
     std::string text;
-    for (const T_CODE_ELEMENT* element : OfTypes(hinges))
+    for (const T_CODE_ELEMENT* element : FirstsOfTypes(hinges))
         for (const T_CODE_ROW_OF_HINGE& row : HingeRows(*element)) {
             text += "\n" +
                     Say("IDS_QM_GEN_TRACE", element->hinge->type.name, row.end,
@@ -120,29 +72,12 @@ std::string TraceText(const T_CODE_HINGES& hinges, const T_UNITS& units)
 /// Warnings, each once, with the types that have it.
 std::string WarningsText(const T_CODE_HINGES& hinges)
 {
-    std::vector<std::pair<std::string, std::vector<std::string>>> all;
-    const auto add = [&](const T_CODE_WARNING& warning, const std::string& type) {
-        const std::string text = WarningText(warning);
-        auto at = std::ranges::find(all, text, [](const auto& entry) { return entry.first; });
-        if (at == all.end()) at = all.insert(all.end(), {text, {}});
-        if (!type.empty() && (at->second.empty() || at->second.back() != type))
-            at->second.push_back(type);
-    };
-    for (const T_CODE_WARNING& warning : hinges.warnings)
-        add(warning, "");
-    for (const T_CODE_ELEMENT* element : OfTypes(hinges)) {
-        for (const T_CODE_WARNING& warning : element->hinge->warnings)
-            add(warning, element->hinge->type.name);
-        for (const T_CODE_ROW_OF_HINGE& row : HingeRows(*element))
-            for (const T_CODE_WARNING& warning : row.of->warnings)
-                add(warning, element->hinge->type.name);
-    }
     std::string text;
-    for (const auto& [warning, types] : all) {
+    for (const auto& [warning, elements] : HingeWarnings(hinges)) {
         text += "! " + warning;
-        for (std::size_t i = 0; i < types.size(); ++i)
-            text += (i == 0 ? " [" : ", ") + types[i];
-        text += types.empty() ? "\n" : "]\n";
+        for (std::size_t i = 0; i < elements.size(); ++i)
+            text += (i == 0 ? " [" : ", ") + elements[i]->hinge->type.name;
+        text += elements.empty() ? "\n" : "]\n";
     }
     return text;
 }
@@ -198,6 +133,13 @@ std::string IterationsText(const T_CODE_HINGES& hinges, const T_UNITS& units)
 
 EXIT_CODE CheckOptions(const T_HINGE_GENERATE_OPTIONS& o, T_CODE_REQUEST& request)
 {
+    if (o.stale) {
+        if (!o.code.empty() || o.all || !o.elements.empty())
+            return Complain(EXIT_CODE::Usage, Say("IDS_QM_GEN_STALE_ALONE"));
+        return CheckOutputs(o.file, {{o.out, OUTPUT_KIND::Document}, {o.json, OUTPUT_KIND::Json}},
+                            o.overwrite);
+    }
+    if (o.code.empty()) return Complain(EXIT_CODE::Usage, Say("IDS_QM_GEN_CODE_NEEDED"));
     if (o.all == !o.elements.empty())
         return Complain(EXIT_CODE::Usage, Say("IDS_QM_GEN_ONE_OF", "--all", "--elements"));
     const auto code = std::ranges::find(kHingeCodeNames, o.code);
@@ -223,16 +165,18 @@ EXIT_CODE RunHingeGenerate(const T_HINGE_GENERATE_OPTIONS& o)
     T_CODE_HINGES hinges;
     T_HINGE_REFUSAL refusal;
     int loadCase = 0;
-    if (const EXIT_CODE code = ReadRequest(o, doc, request, loadCase); code != EXIT_CODE::Done)
-        return code;
+    if (!o.stale)
+        if (const EXIT_CODE code = ReadRequest(o, doc, request, loadCase); code != EXIT_CODE::Done)
+            return code;
     CCodeHinges generator(doc);
-    if (!(loadCase == 0 ? generator.Generate(request, hinges, refusal)
-                        : generator.GenerateFromPush(request, loadCase, hinges, refusal)))
+    if (!(o.stale         ? generator.Regenerate(hinges, refusal)
+          : loadCase == 0 ? generator.Generate(request, hinges, refusal)
+                          : generator.GenerateFromPush(request, loadCase, hinges, refusal)))
         return Complain(EXIT_CODE::BadInput, o.file + ": " + refusal.text);
     const T_UNITS units = doc.Unit().Units();
     if (o.json != "-") {
-        const bool chord = IsChordCode(request.options.code);
-        const std::string text = IterationsText(hinges, units) + Table(hinges, chord, units) +
+        const std::string text = IterationsText(hinges, units) + Table(hinges, false, units) +
+                                 Table(hinges, true, units) +
                                  (o.trace ? TraceText(hinges, units) : "") + WarningsText(hinges);
         std::fputs(text.c_str(), stdout);
     }
@@ -240,7 +184,8 @@ EXIT_CODE RunHingeGenerate(const T_HINGE_GENERATE_OPTIONS& o)
         (void)Complain(EXIT_CODE::NotFound, Say("IDS_QM_GEN_SKIPPED", skipped.text));
     if (const EXIT_CODE code = SaveDocument(doc, o.out); code != EXIT_CODE::Done) return code;
     if (!o.json.empty())
-        if (const EXIT_CODE code = WriteOutput(o.json, CodeHingesJson(hinges, o.code, units));
+        if (const EXIT_CODE code =
+                WriteOutput(o.json, CodeHingesJson(hinges, CodesOf(hinges), units));
             code != EXIT_CODE::Done)
             return code;
     if (o.json != "-")

@@ -11,6 +11,7 @@ struct T_HINGE_GENERATE_OPTIONS {
     std::string code;     // one of kHingeCodeNames
     std::string elements; // "1,4-9"
     bool all = false;
+    bool stale = false;            // those of stale types, by their own code and level
     std::string level = "primary"; // or "secondary"
     bool keepGoing = false;
     std::string push;       // load case whose V counts

@@ -1,10 +1,12 @@
 #include "qm_rps/generate/codehingerows.h"
 
 #include "qm_base/say.h"
+#include "qm_base/textformat.h"
 #include "qm_rps/push/lawaxial.h"
 
 #include <algorithm>
 #include <cmath>
+#include <set>
 
 namespace {
 
@@ -66,6 +68,11 @@ void AppendRows(const T_CODE_ELEMENT& element, const T_CODE_COMPONENT& b,
     }
 }
 
+std::string Digits(double value)
+{
+    return FormatText("%.5g", value);
+}
+
 } // namespace
 
 std::vector<T_CODE_ROW_OF_HINGE> HingeRows(const T_CODE_ELEMENT& element)
@@ -77,6 +84,85 @@ std::vector<T_CODE_ROW_OF_HINGE> HingeRows(const T_CODE_ELEMENT& element)
             AppendRows(element, b, at.ends, {at.axial, at.axial}, rows);
     }
     return rows;
+}
+
+std::vector<std::string> HingeRowHeads(const T_CODE_HINGES& hinges, bool chord,
+                                       const T_UNITS& units)
+{
+    const std::string force(NameOf(units.force)), moment = UnitText(kDimMoment, units);
+    bool forces = false; // not moments alone
+    for (const T_CODE_ELEMENT& element : hinges.elements)
+        for (const T_CODE_COMPONENT& c : element.hinge->components)
+            forces = forces || c.component < HINGE_COMPONENT::Mx;
+    std::vector<std::string> heads{
+        Say("IDS_QM_GEN_END"),
+        Say("IDS_QM_GEN_AXIS"),
+        "+/-",
+        "N (" + force + ")",
+        forces ? "F, M (" + UnitText(kDimForce, units) + ", " + moment + ")" : "M (" + moment + ")",
+        "V/Vn"};
+    const std::vector<std::string> more =
+        chord ? std::vector<std::string>{"theta_y", "DL", "SD", "NC"}
+              : std::vector<std::string>{"a", "b", "c", "IO", "LS", "CP"};
+    heads.insert(heads.end(), more.begin(), more.end());
+    return heads;
+}
+
+std::vector<std::string> HingeRowCells(const T_CODE_ROW_OF_HINGE& row, bool chord,
+                                       const T_UNITS& units)
+{
+    const T_CODE_SIDE& side = *row.of;
+    const T_CODE_BACKBONE& bone = side.bone;
+    const T_DIM dim = DeformDim(row.component, HINGE_DEFINITION::MomentRotation);
+    const auto deform = [&](double value) { return Digits(FromSi(value, units, dim)); };
+    std::vector<std::string> cells{
+        row.end,
+        kComponentNames[static_cast<std::size_t>(row.component)],
+        row.side,
+        Digits(FromSi(row.axial, units, kDimForce)),
+        Digits(FromSi(side.strength, units, StrengthDim(row.component))),
+        side.shearStrength > 0.0 ? Digits(side.shear / side.shearStrength) : std::string("-")};
+    if (chord) {
+        cells.push_back(deform(bone.yieldDeform));
+    } else {
+        cells.push_back(deform(bone.Plastic(bone.C.deform)));
+        cells.push_back(deform(bone.Plastic(bone.E.deform)));
+        cells.push_back(Digits(bone.D.strength));
+    }
+    for (const double level : bone.acceptance.value_or(std::array<double, 3>{}))
+        cells.push_back(deform(chord ? level : bone.Plastic(level)));
+    return cells;
+}
+
+std::vector<const T_CODE_ELEMENT*> FirstsOfTypes(const T_CODE_HINGES& hinges)
+{
+    std::vector<const T_CODE_ELEMENT*> firsts;
+    std::set<const T_CODE_HINGE*> seen;
+    for (const T_CODE_ELEMENT& element : hinges.elements)
+        if (seen.insert(element.hinge.get()).second) firsts.push_back(&element);
+    return firsts;
+}
+
+std::vector<std::pair<std::string, std::vector<const T_CODE_ELEMENT*>>>
+HingeWarnings(const T_CODE_HINGES& hinges)
+{
+    std::vector<std::pair<std::string, std::vector<const T_CODE_ELEMENT*>>> all;
+    const auto add = [&](const T_CODE_WARNING& warning, const T_CODE_ELEMENT* of) {
+        const std::string text = WarningText(warning);
+        auto at = std::ranges::find(all, text, [](const auto& entry) { return entry.first; });
+        if (at == all.end()) at = all.insert(all.end(), {text, {}});
+        if (of && (at->second.empty() || at->second.back() != of)) at->second.push_back(of);
+    };
+    for (const T_CODE_WARNING& warning : hinges.warnings)
+        add(warning, nullptr);
+    for (const T_CODE_ELEMENT* element : FirstsOfTypes(hinges)) {
+        for (const T_CODE_WARNING& warning : element->hinge->warnings)
+            add(warning, element);
+        for (const T_CODE_ROW_OF_HINGE& row : HingeRows(*element))
+            for (const T_CODE_WARNING& warning : row.of->warnings)
+                add(warning, element);
+    }
+    return all;
 }
 
 std::string MarkText(CODE_MARK mark)

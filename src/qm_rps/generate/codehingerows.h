@@ -14,6 +14,18 @@ struct T_CODE_ROW_OF_HINGE {
 };
 std::vector<T_CODE_ROW_OF_HINGE> HingeRows(const T_CODE_ELEMENT& element);
 
+/// End, axis, side, N, strength, V/Vn and the backbone: a, b, c, IO, LS, CP as plastic
+/// deformations; theta_y, DL, SD, NC as total ones (chord). In the given units.
+std::vector<std::string> HingeRowHeads(const T_CODE_HINGES& hinges, bool chord,
+                                       const T_UNITS& units);
+std::vector<std::string> HingeRowCells(const T_CODE_ROW_OF_HINGE& row, bool chord,
+                                       const T_UNITS& units);
+/// The first element of each type, which stands for the others: they have the same numbers.
+std::vector<const T_CODE_ELEMENT*> FirstsOfTypes(const T_CODE_HINGES& hinges);
+/// What the types must be known for, each text once, with the first elements of those that have it.
+std::vector<std::pair<std::string, std::vector<const T_CODE_ELEMENT*>>>
+HingeWarnings(const T_CODE_HINGES& hinges);
+
 /// "computed", "sighted twice" ...
 std::string MarkText(CODE_MARK mark);
 /// "kN m", "kN/m2", "1/m"; empty: without a unit.

@@ -4,6 +4,7 @@
 #include "qm_db/editscope.h"
 
 #include <algorithm>
+#include <iterator>
 #include <set>
 #include <utility>
 
@@ -173,6 +174,30 @@ int CCodeHinges::Store(std::vector<T_GROUP>& groups, const T_CODE_REQUEST& reque
     return 0;
 }
 
+void CCodeHinges::Warn(T_CODE_HINGES& out) const
+{
+    if (!m_axial.IsLoaded()) out.warnings.push_back({"IDS_QM_GEN_WARN_NO_LOADS", {}});
+    if (!m_doc.Data().Model().pushControl.hingeTypes.empty())
+        out.warnings.push_back({"IDS_QM_GEN_WARN_ACTING", {}});
+}
+
+int CCodeHinges::Preview(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
+                         T_HINGE_REFUSAL& refusal)
+{
+    std::string reason;
+    if (!Analyse(reason)) {
+        refusal = RefusalOf(0, reason);
+        return 0;
+    }
+    T_CODE_HINGES made;
+    std::vector<T_GROUP> groups;
+    if (!Group(request, groups, made, refusal)) return 0;
+    Warn(made);
+    made.types = groups.size();
+    out = std::move(made);
+    return 1;
+}
+
 int CCodeHinges::Generate(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
                           T_HINGE_REFUSAL& refusal)
 {
@@ -184,9 +209,7 @@ int CCodeHinges::Generate(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
     T_CODE_HINGES made;
     std::vector<T_GROUP> groups;
     if (!Group(request, groups, made, refusal) || !Store(groups, request, refusal)) return 0;
-    if (!m_axial.IsLoaded()) made.warnings.push_back({"IDS_QM_GEN_WARN_NO_LOADS", {}});
-    if (!m_doc.Data().Model().pushControl.hingeTypes.empty())
-        made.warnings.push_back({"IDS_QM_GEN_WARN_ACTING", {}});
+    Warn(made);
     made.types = groups.size();
     out = std::move(made);
     return 1;
@@ -229,39 +252,93 @@ int CCodeHinges::GenerateFromPush(T_CODE_REQUEST request, int loadCase, T_CODE_H
     return 1;
 }
 
-std::string CCodeHinges::FaultOf(int hingeType)
+int CCodeHinges::Regenerate(T_CODE_HINGES& out, T_HINGE_REFUSAL& refusal)
+{
+    const T_MODEL& model = m_doc.Data().Model();
+    std::vector<T_CODE_REQUEST> stale; // types that were asked for alike have one request
+    std::string text;
+    for (const auto& [key, type] : model.hingeTypes) {
+        if (!type.generated || StateOf(key, text) != CODE_TYPE_STATE::Stale) continue;
+        const T_GENERATED& made = *type.generated;
+        const auto code = std::ranges::find(kHingeCodeNames, made.code);
+        T_CODE_REQUEST request;
+        request.options = {static_cast<HINGE_CODE>(code - kHingeCodeNames.begin()), made.secondary,
+                           made.tie, made.axialRange};
+        request.elements = ElementsWithHingeType(model, key);
+        for (const int id : request.elements)
+            if (!made.pushed.empty()) request.pushed[id] = made.pushed;
+        const auto alike = std::ranges::find_if(stale, [&](const T_CODE_REQUEST& other) {
+            return other.options.code == request.options.code &&
+                   other.options.secondary == request.options.secondary &&
+                   other.options.tie == request.options.tie &&
+                   other.options.axialRange == request.options.axialRange;
+        });
+        if (alike == stale.end()) {
+            stale.push_back(std::move(request));
+            continue;
+        }
+        std::ranges::copy(request.elements, std::back_inserter(alike->elements));
+        alike->pushed.merge(request.pushed);
+    }
+    CEditScope edit(m_doc, "hinges of a code");
+    T_CODE_HINGES all;
+    for (const T_CODE_REQUEST& request : stale) {
+        T_CODE_HINGES made;
+        if (!Generate(request, made, refusal)) return 0;
+        all.types += made.types;
+        all.warnings = std::move(made.warnings); // of the model: the same of each
+        std::ranges::move(made.elements, std::back_inserter(all.elements));
+    }
+    if (!stale.empty() && !edit.Commit()) {
+        refusal = RefusalOf(0, Say("IDS_QM_HINGE_NOT_STORED"));
+        return 0;
+    }
+    out = std::move(all);
+    return 1;
+}
+
+CODE_TYPE_STATE CCodeHinges::StateOf(int hingeType, std::string& text)
 {
     const T_MODEL& model = m_doc.Data().Model();
     const T_PHGT_D& type = model.hingeTypes.at(hingeType);
     const auto code = std::ranges::find(kHingeCodeNames, type.generated->code);
-    if (code == kHingeCodeNames.end()) return Say("IDS_QM_GEN_CODE", type.generated->code);
+    const auto notChecked = [&text](std::string words) {
+        text = std::move(words);
+        return CODE_TYPE_STATE::NotChecked;
+    };
+    if (code == kHingeCodeNames.end())
+        return notChecked(Say("IDS_QM_GEN_CODE", type.generated->code));
     std::string reason;
-    if (!Analyse(reason)) return Say("IDS_QM_GEN_NOT_CHECKED", reason);
+    if (!Analyse(reason)) return notChecked(Say("IDS_QM_GEN_NOT_CHECKED", reason));
     T_HINGE_MEMBER member;
     for (const int id : ElementsWithHingeType(model, hingeType)) {
         if (!ReadMember(model, id, m_axial, member, reason))
-            return Say("IDS_QM_GEN_NOT_CHECKED",
-                       Say("IDS_QM_HINGE_ELEMENT", std::to_string(id), reason));
+            return notChecked(Say("IDS_QM_GEN_NOT_CHECKED",
+                                  Say("IDS_QM_HINGE_ELEMENT", std::to_string(id), reason)));
         member.pushed = type.generated->pushed;
-        if (!SameInputs(type.generated->inputs, InputsOf(model, member)))
-            return Say("IDS_QM_GEN_STALE", std::to_string(id));
+        if (SameInputs(type.generated->inputs, InputsOf(model, member))) continue;
+        text = Say("IDS_QM_GEN_STALE", std::to_string(id));
+        return CODE_TYPE_STATE::Stale;
     }
-    if (member.element == 0) return {}; // no element has it
+    text.clear();
+    if (member.element == 0) return CODE_TYPE_STATE::Fresh; // no element has it
     T_CODE_HINGE today;
     const T_GENERATED& made = *type.generated;
     const T_CODE_OPTIONS options{static_cast<HINGE_CODE>(code - kHingeCodeNames.begin()),
                                  made.secondary, made.tie, made.axialRange};
     if (!MakeCodeHinge(model, member, options, today, reason))
-        return Say("IDS_QM_GEN_NOT_CHECKED", reason);
-    return SameHinge(type, today.type) ? std::string() : Say("IDS_QM_GEN_EDITED");
+        return notChecked(Say("IDS_QM_GEN_NOT_CHECKED", reason));
+    if (SameHinge(type, today.type)) return CODE_TYPE_STATE::Fresh;
+    text = Say("IDS_QM_GEN_EDITED");
+    return CODE_TYPE_STATE::Edited;
 }
 
 std::vector<T_FINDING> CCodeHinges::TypeFindings(int hingeType)
 {
     const auto found = m_doc.Data().Model().hingeTypes.find(hingeType);
     if (found == m_doc.Data().Model().hingeTypes.end() || !found->second.generated) return {};
-    const std::string fault = FaultOf(hingeType);
-    if (fault.empty()) return {};
+    std::string fault;
+    if (StateOf(hingeType, fault) == CODE_TYPE_STATE::Fresh) return {};
     T_FINDING finding;
     finding.field = "generated";
     finding.ruleText = found->second.generated->code;

@@ -35,13 +35,27 @@ struct T_CODE_HINGES {
     std::size_t types = 0;
 };
 
+/// How a generated type stands to the model as it is.
+enum class CODE_TYPE_STATE {
+    Fresh,
+    Stale,     // section, material, member or loads are not those that it was made of
+    Edited,    // they are, and its curves are others
+    NotChecked // its code, or today's inputs, are not known
+};
+
 class CCodeHinges {
 public:
     explicit CCodeHinges(CDBDoc& doc) : m_doc(doc) {}
 
-    /// As one undoable edit: the elements' hinges are replaced, generated types that are left
-    /// without a hinge go. Members with the same section, material, lengths and axial forces share
-    /// a type. 1 done; 0 with the first element that can't have a hinge, the document unchanged.
+    /// What Generate would give, its types without names; the document stays as it is. 1 done; 0 as
+    /// Generate.
+    [[nodiscard]] int Preview(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
+                              T_HINGE_REFUSAL& refusal);
+
+    /// As one undoable edit, or as a part of the one that is open: the elements' hinges are
+    /// replaced, generated types that are left without a hinge go. Members with the same section,
+    /// material, lengths and axial forces share a type. 1 done; 0 with the first element that can't
+    /// have a hinge, the document unchanged.
     [[nodiscard]] int Generate(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
                                T_HINGE_REFUSAL& refusal);
 
@@ -54,8 +68,15 @@ public:
     static constexpr double kSameShear = 0.01;
     static constexpr int kMostPushes = 8;
 
-    /// Of a generated type: section, material, member or loads are not those that it was made of;
-    /// or they are, and its curves have been edited. Else nothing.
+    /// Generates the hinges of the elements of every stale type again, by the type's code and
+    /// level (tie force, axial range and V of a push, too), as one undoable edit; the types of
+    /// these elements are new ones. 1 done, `out` without elements where no type is stale; 0 as
+    /// Generate.
+    [[nodiscard]] int Regenerate(T_CODE_HINGES& out, T_HINGE_REFUSAL& refusal);
+
+    /// Of a generated type, with what is to be said of it.
+    CODE_TYPE_STATE StateOf(int hingeType, std::string& text);
+    /// The same as findings; a fresh type has none.
     std::vector<T_FINDING> TypeFindings(int hingeType);
 
 private:
@@ -65,7 +86,7 @@ private:
               T_HINGE_REFUSAL& refusal);
     int Store(std::vector<T_GROUP>& groups, const T_CODE_REQUEST& request,
               T_HINGE_REFUSAL& refusal);
-    std::string FaultOf(int hingeType);
+    void Warn(T_CODE_HINGES& out) const;
 
     CDBDoc& m_doc;
     CInitialAxial m_axial;
