@@ -1,6 +1,7 @@
 #include "hingetools.h"
 
 #include "qm_base/say.h"
+#include "qm_rps/codehingedlg.h"
 #include "qm_rps/hingeoptionsdlg.h"
 #include "qm_rps/po_hingetypelistdlg.h"
 #include "qm_rps/pushoverhingedatatype.h"
@@ -27,6 +28,14 @@ void RunHingeList(T_DESKTOP& desktop, int selected)
     list.SetView(&desktop.view);
     list.m_selected = selected;
     (void)list.DoModal();
+    desktop.changed();
+}
+
+void RunCodeHinges(T_DESKTOP& desktop)
+{
+    CCodeHingeDlg dialog(desktop.doc);
+    dialog.SetView(&desktop.view);
+    (void)dialog.DoModal();
     desktop.changed();
 }
 
@@ -78,7 +87,7 @@ void RegisterHingeViews(CViewFactory& factory)
          {RegisterHingeListViews, RegisterHingeTypeView, RegisterHingeFemaViews,
           RegisterHingeMultiView, RegisterHingeEuroView, RegisterHingeInteractionViews,
           RegisterHingeLengthViews, RegisterHingeStrengthViews, RegisterHingeOptionsView,
-          RegisterSectionViews})
+          RegisterSectionViews, RegisterCodeHingeView})
         add(factory);
 }
 
@@ -87,6 +96,8 @@ T_COMMANDS HingeCommands(T_DESKTOP& desktop)
     return {{kMenu, "IDS_QM_UI_HINGE_TYPES", "Ctrl+Shift+H", [&desktop] { RunTypeList(desktop); }},
             {kMenu, "IDS_QM_UI_HINGES_GENERATED", "Ctrl+Shift+G",
              [&desktop] { RunHingeList(desktop, 0); }},
+            {kMenu, "IDS_QM_UI_GEN_MENU", "", [&desktop] { RunCodeHinges(desktop); },
+             [&desktop] { return !desktop.doc.Data().Model().elements.empty(); }},
             {kMenu, "IDS_QM_UI_HINGE_TABLE", "", [&desktop] { RunTable(desktop); }},
             {kMenu, "IDS_QM_UI_SECC_CMD", "", [&desktop] { RunSectionCurves(desktop, 0); }},
             {kMenu, "IDS_QM_UI_HINGE_OPTIONS_CMD", "", [&desktop] { RunOptions(desktop); }}};

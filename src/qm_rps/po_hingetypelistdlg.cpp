@@ -30,7 +30,8 @@ std::vector<CPO_HingeTypeListDlg::T_ROW> CPO_HingeTypeListDlg::Rows() const
 {
     std::vector<T_ROW> rows;
     for (const auto& [key, type] : HingeTypesOf(m_doc))
-        rows.push_back({key, NameOf(key, type.name), DataToStr(type.element)});
+        rows.push_back({key, NameOf(key, type.name), DataToStr(type.element), m_types.CodeText(key),
+                        m_types.Fault(key)});
     return rows;
 }
 

@@ -3,6 +3,7 @@
 
 #include "qm_base/mdialog.h"
 #include "qm_db/dbdoc.h"
+#include "qm_rps/generate/generatedtypes.h"
 
 #include <optional>
 
@@ -12,13 +13,15 @@ public:
         int key = 0;
         std::string name;    // "1 : column", key and name
         std::string element; // text of the element type
+        std::string code{};  // that has generated it: "ASCE41-17"; empty: none
+        std::string fault{}; // of a generated one: why its numbers are not those of the code today
         bool operator==(const T_ROW&) const = default;
     };
-    static constexpr std::array<const char*, 2> kHeads{"IDS_RPS_PO_Hinge_Name",
-                                                       "IDS_RPS_PO_Element_Type"};
+    static constexpr std::array<const char*, 3> kHeads{
+        "IDS_RPS_PO_Hinge_Name", "IDS_RPS_PO_Element_Type", "IDS_QM_UI_GEN_GENERATED"};
 
     /// The document must outlive the list.
-    explicit CPO_HingeTypeListDlg(CDBDoc& doc) : m_doc(doc) {}
+    explicit CPO_HingeTypeListDlg(CDBDoc& doc) : m_doc(doc), m_types(doc) {}
 
     std::vector<T_ROW> Rows() const;
     /// Text of an element type; a value outside the five is shown as an error, not refused.
@@ -47,4 +50,5 @@ private:
     int Edit(int key, const T_PHGT_D& type, bool fresh);
 
     CDBDoc& m_doc;
+    mutable CGeneratedTypes m_types; // keeps what it found
 };

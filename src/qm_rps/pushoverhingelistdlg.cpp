@@ -127,8 +127,12 @@ std::vector<CPushOverHingeListDlg::T_ROW> CPushOverHingeListDlg::Rows(bool crack
         const std::string name = CPO_HingeTypeListDlg::NameOf(
             hinge.hingeType,
             gone ? MMSGFunction::GetValue("IDS_PUSHOVER_Error") : type->second.name);
-        T_ROW row{key, hinge.element, name, crack ? hinge.crack : hinge.yield,
-                  generator.StaleText(hinge)};
+        T_ROW row{key,
+                  hinge.element,
+                  name,
+                  crack ? hinge.crack : hinge.yield,
+                  generator.StaleText(hinge),
+                  m_types.Fault(hinge.hingeType)};
         if (gone || !HasOwnEnd(hinge)) {
             rows.push_back(row);
             continue;

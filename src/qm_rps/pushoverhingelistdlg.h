@@ -2,6 +2,7 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
+#include "qm_rps/generate/generatedtypes.h"
 #include "qm_rps/yieldstrengthcalcoptdlg.h"
 
 #include <vector>
@@ -9,7 +10,7 @@
 class CPushOverHingeListDlg : public zql::frx::MDialog {
 public:
     /// The document must outlive the list; strengths are in its current units.
-    explicit CPushOverHingeListDlg(CDBDoc& doc) : m_doc(doc) {}
+    explicit CPushOverHingeListDlg(CDBDoc& doc) : m_doc(doc), m_types(doc) {}
 
     /// Text of the interaction kind 0 to 4; another code is an assertion failure and an empty text.
     static std::string InteractionText(int code);
@@ -30,7 +31,8 @@ public:
         int key = 0, element = 0;
         std::string type; // "2 : column", "2 : column, J-end"; an error text where it is gone
         std::array<T_SIDES<double>, 6> strengths{}; // 0: the end has no such hinge, or no strength
-        std::string stale; // strengths that are not those of today; empty: all are
+        std::string stale;   // strengths that are not those of today; empty: all are
+        std::string fault{}; // of a generated type: why its numbers are not the code's today
         bool operator==(const T_ROW&) const = default;
     };
     /// Heads of the columns of strengths: "Fx(+)", "Fx(-)" ... "Mz(-)".
@@ -63,5 +65,6 @@ private:
     std::optional<HINGE_ELEMENT> TypeElement() const;
 
     CDBDoc& m_doc;
+    mutable CGeneratedTypes m_types; // keeps what it found
     T_YIELD_CALC_OPT m_options;
 };

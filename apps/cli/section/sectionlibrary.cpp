@@ -49,7 +49,7 @@ EXIT_CODE RunSectionShapes(const std::string& find)
 {
     T_TABLE_ROWS rows{{"D1 (mm)", "D2 (mm)", "D3 (mm)", "D4 (mm)", "r (mm)", "A (cm2)", "Iy (cm4)",
                        "Iz (cm4)", "Zy (cm3)", "Zz (cm3)", Say("IDS_QM_SECC_HEAD_SHAPE")}};
-    for (const T_STOCK_SHAPE& shape : SteelShapes())
+    for (const T_ROLLED_SHAPE& shape : SteelShapes())
         if (Begins(shape.name, find)) rows.push_back(Row(shape.name, *NamedShape(shape.name)));
     if (rows.size() == 1) {
         const std::optional<T_SECT_D> hollow = NamedShape(find);

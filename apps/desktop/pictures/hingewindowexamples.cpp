@@ -2,6 +2,7 @@
 #include "hingetools.h"
 #include "mainwindow.h"
 
+#include "qm_rps/codehingedlg.h"
 #include "qm_rps/po_hingealphayspandlg.h"
 #include "qm_rps/po_hingeintegrationpointdlg.h"
 #include "qm_rps/po_hingelengthmphidlg.h"
@@ -176,6 +177,19 @@ std::unique_ptr<QWidget> SectionWindow(CMainWindow& main)
     return WindowOf(main, std::move(dlg));
 }
 
+/// What all members of a frame would get, with the trace of a column.
+std::unique_ptr<QWidget> CodeWindow(CMainWindow& main)
+{
+    auto dlg = std::make_unique<CCodeHingeDlg>(main.Doc());
+    dlg->OnAll();
+    (void)dlg->OnPreview();
+    const QSize size = main.Desktop().factory.Find(*dlg)->size;
+    std::unique_ptr<QWidget> window = WindowOf(main, std::move(dlg));
+    window->show();
+    window->resize(size);
+    return window;
+}
+
 } // namespace
 
 std::vector<T_WINDOW_EXAMPLE> HingeWindowExamples()
@@ -226,5 +240,6 @@ std::vector<T_WINDOW_EXAMPLE> HingeWindowExamples()
         {"hinge-sections", kModel, DescriptionWindow<CYieldStrengthCalcOptEffDescDlg>},
         {"hinge-table", kModel, TableWindow},
         {"section-curves", "rc-frame-code-hinges", SectionWindow},
+        {"code-hinges", "rc-frame-code-hinges", CodeWindow},
     };
 }

@@ -149,10 +149,10 @@ std::optional<T_STOCK_SHAPE> Hollow(const std::string& plain)
 
 } // namespace
 
-std::span<const T_STOCK_SHAPE> SteelShapes()
+std::span<const T_ROLLED_SHAPE> SteelShapes()
 {
-    static const std::vector<T_STOCK_SHAPE> kShapes = [] {
-        std::vector<T_STOCK_SHAPE> out;
+    static const std::vector<T_ROLLED_SHAPE> kShapes = [] {
+        std::vector<T_ROLLED_SHAPE> out;
         for (const T_ROW& r : kRows)
             out.push_back({r.name, r.height * kMm, r.width * kMm, r.web * kMm, r.flange * kMm,
                            r.fillet * kMm});
@@ -164,7 +164,7 @@ std::span<const T_STOCK_SHAPE> SteelShapes()
 std::optional<T_STOCK_SHAPE> FindShape(const std::string& name)
 {
     const std::string plain = Plain(name);
-    for (const T_STOCK_SHAPE& s : SteelShapes())
+    for (const T_ROLLED_SHAPE& s : SteelShapes())
         if (Plain(s.name) == plain)
             return T_STOCK_SHAPE{STOCK_SHAPE::I, {s.height, s.width, s.web, s.flange}, s.fillet};
     return Hollow(plain);

@@ -7,11 +7,11 @@
 #include <string>
 
 /// A rolled I or H.
-struct T_STOCK_SHAPE {
+struct T_ROLLED_SHAPE {
     const char* name = ""; // "IPE 300"
     double height = 0.0, width = 0.0, web = 0.0, flange = 0.0, fillet = 0.0;
 };
-std::span<const T_STOCK_SHAPE> SteelShapes();
+std::span<const T_ROLLED_SHAPE> SteelShapes();
 
 enum class STOCK_SHAPE { I, Box, Pipe };
 /// Sizes in the order of the sections of a model; `fillet` of a box: outer radius of the corners.

@@ -37,8 +37,9 @@ void BuildTypeList(CFormView& form, CPO_HingeTypeListDlg& dlg)
     b.rows = [&dlg] { return dlg.Rows().size(); };
     b.text = [&dlg](std::size_t row, std::size_t c) {
         const CPO_HingeTypeListDlg::T_ROW r = dlg.Rows().at(row);
-        return c == 0 ? r.name : r.element;
+        return c == 0 ? r.name : c == 1 ? r.element : r.code;
     };
+    b.mark = [&dlg](std::size_t row, std::size_t) { return dlg.Rows().at(row).fault; };
     BindSelection(b, dlg, [&dlg] {
         std::vector<int> keys;
         for (const auto& row : dlg.Rows())
@@ -108,8 +109,8 @@ T_GRID_BINDING HingeGrid(CPushOverHingeListDlg& dlg)
         return rows->size();
     };
     b.mark = [rows](std::size_t row, std::size_t) {
-        const std::string& stale = rows->at(row).stale;
-        return stale.empty() ? stale : MMSGFunction::Format("IDS_QM_HINGE_STALE", {stale});
+        const CPushOverHingeListDlg::T_ROW& r = rows->at(row);
+        return r.stale.empty() ? r.fault : MMSGFunction::Format("IDS_QM_HINGE_STALE", {r.stale});
     };
     b.text = [rows](std::size_t row, std::size_t c) {
         const CPushOverHingeListDlg::T_ROW& r = rows->at(row);

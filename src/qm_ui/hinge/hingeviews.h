@@ -17,5 +17,7 @@ void RegisterHingeInteractionViews(CViewFactory& factory);
 void RegisterHingeLengthViews(CViewFactory& factory);
 /// Options of hinges and design codes of the model.
 void RegisterHingeOptionsView(CViewFactory& factory);
+/// Hinges of members as a code gives them.
+void RegisterCodeHingeView(CViewFactory& factory);
 /// Options of the yield strength calculation and their descriptions.
 void RegisterHingeStrengthViews(CViewFactory& factory);

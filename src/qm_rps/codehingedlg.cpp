@@ -1,0 +1,318 @@
+#include "qm_rps/codehingedlg.h"
+
+#include "qm_base/say.h"
+#include "qm_base/textformat.h"
+#include "qm_rps/desk/elementlist.h"
+
+#include <algorithm>
+
+CCodeHingeDlg::CCodeHingeDlg(CDBDoc& doc) : m_doc(doc), m_scene(doc), m_types(doc)
+{
+    const auto& concrete = doc.Data().Model().styp.designCodes.concrete;
+    const bool eurocode = concrete && concrete->starts_with("Eurocode");
+    m_request.options.code = eurocode ? HINGE_CODE::En1998 : HINGE_CODE::Asce17;
+    m_request.keepGoing = true;
+    m_status = Say("IDS_QM_UI_GEN_CHOOSE");
+}
+
+// ---- members ------------------------------------------------------------------------------------
+
+bool CCodeHingeDlg::IsChosen(std::size_t line)
+{
+    return line < Scene().lines.size() && m_elements.contains(Scene().lines[line].id);
+}
+
+void CCodeHingeDlg::OnLine(std::size_t line)
+{
+    if (line >= Scene().lines.size()) return;
+    const int id = Scene().lines[line].id;
+    if (m_elements.erase(id) == 0) m_elements.insert(id);
+    Forget();
+}
+
+void CCodeHingeDlg::OnLines(const std::vector<std::size_t>& lines)
+{
+    for (const std::size_t line : lines)
+        if (line < Scene().lines.size()) m_elements.insert(Scene().lines[line].id);
+    Forget();
+}
+
+void CCodeHingeDlg::OnAll()
+{
+    const T_MODEL& model = m_doc.Data().Model();
+    const auto isSteel = [&model](const T_ELEM_D& element) {
+        const auto material = model.materials.find(element.material);
+        return material != model.materials.end() && material->second.type == MATL_CLASS::Steel;
+    };
+    for (const auto& [id, element] : model.elements)
+        if (element.kind == ELEM_KIND::Beam ||
+            (element.kind == ELEM_KIND::Truss && isSteel(element)))
+            m_elements.insert(id);
+    Forget();
+}
+
+void CCodeHingeDlg::OnNone()
+{
+    m_elements.clear();
+    Forget();
+}
+
+void CCodeHingeDlg::OnStale()
+{
+    const std::vector<int> stale = m_types.StaleElements();
+    m_elements = {stale.begin(), stale.end()};
+    Forget();
+    const T_MODEL& model = m_doc.Data().Model();
+    for (const auto& entry : model.hinges) {
+        if (!m_elements.contains(entry.second.element)) continue;
+        const auto type = model.hingeTypes.find(entry.second.hingeType);
+        if (type == model.hingeTypes.end() || !type->second.generated) continue;
+        const auto code = std::ranges::find(kHingeCodeNames, type->second.generated->code);
+        if (code == kHingeCodeNames.end()) continue;
+        m_request.options.code = static_cast<HINGE_CODE>(code - kHingeCodeNames.begin());
+        m_request.options.secondary = type->second.generated->secondary;
+        break;
+    }
+}
+
+std::string CCodeHingeDlg::ElementsText() const
+{
+    return ElementListText({m_elements.begin(), m_elements.end()});
+}
+
+int CCodeHingeDlg::OnElements(const std::string& text)
+{
+    const std::optional<std::vector<int>> ids = ParseElementList(text);
+    if (!ids) {
+        ShowMessage("IDS_QM_CLI_HINGE_ELEMENT_LIST", Say("IDS_QM_CLI_HINGE_ELEMENT_LIST", text));
+        return 0;
+    }
+    for (const int id : *ids)
+        if (!m_doc.Data().Model().elements.contains(id)) {
+            ShowMessage("IDS_QM_UI_GEN_NO_ELEMENT",
+                        Say("IDS_QM_UI_GEN_NO_ELEMENT", std::to_string(id)));
+            return 0;
+        }
+    m_elements = {ids->begin(), ids->end()};
+    Forget();
+    return 1;
+}
+
+// ---- code ---------------------------------------------------------------------------------------
+
+std::vector<std::string> CCodeHingeDlg::CodeTexts()
+{
+    return {kHingeCodeNames.begin(), kHingeCodeNames.end()};
+}
+
+void CCodeHingeDlg::OnCode(HINGE_CODE code)
+{
+    m_request.options.code = code;
+    Forget();
+}
+
+void CCodeHingeDlg::OnSecondary(bool secondary)
+{
+    m_request.options.secondary = secondary;
+    Forget();
+}
+
+void CCodeHingeDlg::OnKeepGoing(bool keepGoing)
+{
+    m_request.keepGoing = keepGoing;
+    Forget();
+}
+
+// ---- what they would get ------------------------------------------------------------------------
+
+/// A preview of another choice is none.
+void CCodeHingeDlg::Forget()
+{
+    m_hinges = {};
+    m_firsts.clear();
+    m_type = m_side = -1;
+    m_shown.reset();
+    m_status = m_elements.empty() ? Say("IDS_QM_UI_GEN_CHOOSE")
+                                  : Say("IDS_QM_UI_GEN_CHOSEN", std::to_string(m_elements.size()));
+}
+
+void CCodeHingeDlg::Take(T_CODE_HINGES hinges)
+{
+    Forget();
+    m_hinges = std::move(hinges);
+    m_firsts = FirstsOfTypes(m_hinges);
+    OnType(m_firsts.empty() ? -1 : 0);
+}
+
+int CCodeHingeDlg::OnPreview()
+{
+    if (m_elements.empty()) return 0;
+    m_request.elements = {m_elements.begin(), m_elements.end()};
+    T_CODE_HINGES hinges;
+    T_HINGE_REFUSAL refusal;
+    if (!CCodeHinges(m_doc).Preview(m_request, hinges, refusal)) {
+        Forget();
+        m_status = refusal.text;
+        return 0;
+    }
+    Take(std::move(hinges));
+    m_status = Say("IDS_QM_UI_GEN_WOULD", std::to_string(m_hinges.elements.size()),
+                   std::to_string(m_hinges.types), std::to_string(m_hinges.skipped.size()));
+    return 1;
+}
+
+T_TEXT_TABLE CCodeHingeDlg::Types() const
+{
+    constexpr std::array<const char*, kMemberKindNames.size()> kKinds{
+        "IDS_QM_UI_GEN_BEAM",  "IDS_QM_UI_GEN_COLUMN", "IDS_QM_UI_GEN_WALL",
+        "IDS_QM_UI_GEN_BRACE", "IDS_QM_UI_GEN_PIER",   "IDS_QM_UI_GEN_SPANDREL"};
+    T_TEXT_TABLE table;
+    table.columns = {{Say("IDS_QM_UI_HEAD_SECTION")},
+                     {Say("IDS_QM_UI_GEN_MEMBER")},
+                     {Say("IDS_QM_UI_GEN_ELEMENTS")}};
+    for (const T_CODE_ELEMENT* first : m_firsts) {
+        std::vector<int> ids;
+        for (const T_CODE_ELEMENT& element : m_hinges.elements)
+            if (element.hinge == first->hinge) ids.push_back(element.member.element);
+        std::ranges::sort(ids);
+        const auto& sections = m_doc.Data().Model().sections;
+        const auto section = sections.find(first->member.section);
+        table.rows.push_back({section == sections.end() ? std::string() : section->second.name,
+                              Say(kKinds[static_cast<std::size_t>(first->member.kind)]),
+                              ElementListText(ids)});
+    }
+    return table;
+}
+
+std::vector<T_CODE_ROW_OF_HINGE> CCodeHingeDlg::Rows() const
+{
+    if (m_type < 0) return {};
+    return HingeRows(*m_firsts.at(static_cast<std::size_t>(m_type)));
+}
+
+bool CCodeHingeDlg::IsChord() const
+{
+    const auto rows = Rows();
+    return rows.empty() ? IsChordCode(m_request.options.code)
+                        : rows.front().of->bone.levels == CODE_LEVELS::DlSdNc;
+}
+
+T_TEXT_TABLE CCodeHingeDlg::Sides() const
+{
+    const T_UNITS units = m_doc.Unit().Units();
+    constexpr std::size_t kWords = 3; // columns before the numbers
+    T_TEXT_TABLE table;
+    for (const std::string& head : HingeRowHeads(m_hinges, IsChord(), units))
+        table.columns.push_back({head, table.columns.size() >= kWords});
+    // The number of columns stays: a chord has two levels less.
+    while (table.columns.size() < HingeRowHeads(m_hinges, false, units).size())
+        table.columns.push_back({});
+    for (const T_CODE_ROW_OF_HINGE& row : Rows()) {
+        table.rows.push_back(HingeRowCells(row, IsChord(), units));
+        table.rows.back().resize(table.columns.size());
+    }
+    return table;
+}
+
+void CCodeHingeDlg::OnType(int row)
+{
+    if (row >= std::ssize(m_firsts)) return;
+    m_type = row;
+    m_side = row < 0 ? -1 : 0;
+    Show();
+}
+
+void CCodeHingeDlg::OnSide(int row)
+{
+    if (row < 0 || row >= std::ssize(Rows())) return;
+    m_side = row;
+    Show();
+}
+
+void CCodeHingeDlg::Show()
+{
+    m_shown.reset();
+    const auto rows = Rows();
+    if (m_side < 0 || m_side >= std::ssize(rows)) return;
+    const T_CODE_ROW_OF_HINGE& row = rows[static_cast<std::size_t>(m_side)];
+    T_SHOWN shown;
+    shown.type = m_firsts[static_cast<std::size_t>(m_type)]->hinge->type;
+    if (shown.type.name.empty())
+        shown.type.name = Types().rows[static_cast<std::size_t>(m_type)].front();
+    RecordFromSi(shown.type, m_doc.Unit().Units());
+    shown.component = row.component;
+    const auto& curves = shown.type.components[static_cast<std::size_t>(row.component)].curves;
+    shown.curve = row.end == "J" ? curves.J : curves.I;
+    shown.page = row.end;
+    m_shown = std::move(shown);
+}
+
+T_TEXT_TABLE CCodeHingeDlg::Trace() const
+{
+    const T_UNITS units = m_doc.Unit().Units();
+    T_TEXT_TABLE table;
+    for (const char* key : {"IDS_QM_UI_GEN_SYMBOL", "IDS_QM_UI_GEN_VALUE", "IDS_QM_UI_GEN_UNIT",
+                            "IDS_QM_UI_GEN_FORMULA", "IDS_QM_UI_GEN_CLAUSE", "IDS_QM_UI_GEN_MARK"})
+        table.columns.push_back({Say(key), table.columns.size() == 1});
+    const auto rows = Rows();
+    if (m_side < 0 || m_side >= std::ssize(rows)) return table;
+    for (const T_CODE_TRACE& line : rows[static_cast<std::size_t>(m_side)].of->trace)
+        table.rows.push_back({line.symbol, FormatText("%.5g", FromSi(line.value, units, line.dim)),
+                              UnitText(line.dim, units), line.text, line.clause,
+                              MarkText(line.mark)});
+    return table;
+}
+
+std::string CCodeHingeDlg::WarningsText() const
+{
+    std::string text;
+    const auto add = [&text](const std::string& line) {
+        text += (text.empty() ? "" : "\n") + line;
+    };
+    const T_CODE_ELEMENT* const shown =
+        m_type < 0 ? nullptr : m_firsts[static_cast<std::size_t>(m_type)];
+    for (const auto& [warning, elements] : HingeWarnings(m_hinges))
+        if (elements.empty() || std::ranges::find(elements, shown) != elements.end())
+            add("! " + warning);
+    for (const T_HINGE_REFUSAL& refusal : m_hinges.skipped)
+        add(Say("IDS_QM_GEN_SKIPPED", refusal.text));
+    return text;
+}
+
+// ---- the hinges themselves ----------------------------------------------------------------------
+
+int CCodeHingeDlg::Refuse(const T_HINGE_REFUSAL& refusal)
+{
+    ShowMessage("IDS_QM_UI_GEN_REFUSED", Say("IDS_QM_UI_GEN_REFUSED", refusal.text));
+    return 0;
+}
+
+int CCodeHingeDlg::OnApply()
+{
+    if (m_elements.empty()) {
+        ShowMessage("IDS_QM_UI_GEN_CHOOSE");
+        return 0;
+    }
+    m_request.elements = {m_elements.begin(), m_elements.end()};
+    T_CODE_HINGES hinges;
+    T_HINGE_REFUSAL refusal;
+    if (!CCodeHinges(m_doc).Generate(m_request, hinges, refusal)) return Refuse(refusal);
+    Take(std::move(hinges));
+    m_status = Say("IDS_QM_GEN_DONE", std::to_string(m_hinges.elements.size()),
+                   std::to_string(m_hinges.types));
+    return 1;
+}
+
+int CCodeHingeDlg::OnRegenerate()
+{
+    T_CODE_HINGES hinges;
+    T_HINGE_REFUSAL refusal;
+    if (!CCodeHinges(m_doc).Regenerate(hinges, refusal)) return Refuse(refusal);
+    m_elements.clear();
+    for (const T_CODE_ELEMENT& element : hinges.elements)
+        m_elements.insert(element.member.element);
+    Take(std::move(hinges));
+    m_status = Say("IDS_QM_GEN_DONE", std::to_string(m_hinges.elements.size()),
+                   std::to_string(m_hinges.types));
+    return 1;
+}

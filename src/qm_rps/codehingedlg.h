@@ -1,0 +1,96 @@
+// Model of the window that gives members the hinges of a code: which members, code and level; what
+// they would get, number by number; then the hinges themselves.
+#pragma once
+
+#include "qm_base/mdialog.h"
+#include "qm_rps/desk/framescene.h"
+#include "qm_rps/dialog/texttable.h"
+#include "qm_rps/generate/codehingerows.h"
+#include "qm_rps/generate/generatedtypes.h"
+
+#include <set>
+
+class CCodeHingeDlg : public zql::frx::MDialog {
+public:
+    /// The document must outlive the dialog. No member is chosen; the code is EN 1998-3 in a model
+    /// of Eurocodes, else ASCE 41-17.
+    explicit CCodeHingeDlg(CDBDoc& doc);
+
+    // ---- members ----
+    const T_FRAME_SCENE& Scene() { return m_scene.Scene(); }
+    /// By line of the scene.
+    bool IsChosen(std::size_t line);
+    std::size_t ChosenCount() const { return m_elements.size(); }
+    /// Lines of the scene: one is taken or taken out again; those of a box are taken.
+    void OnLine(std::size_t line);
+    void OnLines(const std::vector<std::size_t>& lines);
+    void OnAll(); // beams, and trusses of steel: other elements have no such hinges
+    void OnNone();
+    /// Members of types that are out of date, and their code.
+    void OnStale();
+    std::string ElementsText() const; // "1, 4-9"
+    /// 0 with a message: no such list, or an element that the model does not have.
+    [[nodiscard]] int OnElements(const std::string& text);
+
+    // ---- code ----
+    static std::vector<std::string> CodeTexts();
+    HINGE_CODE Code() const { return m_request.options.code; }
+    void OnCode(HINGE_CODE code);
+    bool IsSecondary() const { return m_request.options.secondary; }
+    void OnSecondary(bool secondary);
+    /// Members that can't have a hinge are left out and named, else nothing is done.
+    bool KeepsGoing() const { return m_request.keepGoing; }
+    void OnKeepGoing(bool keepGoing);
+
+    // ---- what they would get ----
+    /// Works the hinges out; the document stays as it is. 0: StatusText says why not.
+    int OnPreview();
+    bool HasPreview() const { return !m_firsts.empty(); }
+    /// A row for each type: section, member, elements.
+    T_TEXT_TABLE Types() const;
+    int Type() const { return m_type; } // chosen row; -1: none
+    void OnType(int row);
+    /// Ends, axes and sides of the chosen type.
+    T_TEXT_TABLE Sides() const;
+    int Side() const { return m_side; }
+    void OnSide(int row);
+    /// The curve of the chosen side's end and axis, in current units; null: none.
+    struct T_SHOWN {
+        T_PHGT_D type;
+        HINGE_COMPONENT component = HINGE_COMPONENT::My;
+        T_SKEL_CURVE curve;
+        std::string page; // "I, J", "I"
+    };
+    const T_SHOWN* Shown() const { return m_shown ? &*m_shown : nullptr; }
+    /// Every number of the chosen side: symbol, value, unit, formula, clause, mark.
+    T_TEXT_TABLE Trace() const;
+    /// Warnings of the chosen type and of the model, members that are left out; a line each.
+    std::string WarningsText() const;
+    std::string StatusText() const { return m_status; }
+
+    // ---- the hinges themselves ----
+    /// Generates them as one edit that can be undone. 0 with a message, the document as it was.
+    [[nodiscard]] int OnApply();
+    /// Members of types that are out of date get theirs again, by each type's code and level.
+    [[nodiscard]] int OnRegenerate();
+    bool HasStale() { return !m_types.StaleElements().empty(); }
+
+private:
+    void Forget();
+    void Take(T_CODE_HINGES hinges);
+    void Show();
+    int Refuse(const T_HINGE_REFUSAL& refusal);
+    std::vector<T_CODE_ROW_OF_HINGE> Rows() const;
+    bool IsChord() const;
+
+    CDBDoc& m_doc;
+    CFrameScene m_scene;
+    CGeneratedTypes m_types;
+    T_CODE_REQUEST m_request;
+    std::set<int> m_elements;
+    T_CODE_HINGES m_hinges;
+    std::vector<const T_CODE_ELEMENT*> m_firsts; // of the types
+    int m_type = -1, m_side = -1;
+    std::optional<T_SHOWN> m_shown;
+    std::string m_status;
+};

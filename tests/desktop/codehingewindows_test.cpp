@@ -1,0 +1,184 @@
+// The window that gives members the hinges of a code, with real events.
+#include "windowplay.h"
+
+#include "qm_db/editscope.h"
+#include "qm_rps/generate/generatedtypes.h"
+#include "qm_ui/frame/frameview.h"
+
+#include <QComboBox>
+#include <QMouseEvent>
+
+using namespace desktop_test;
+
+namespace {
+
+constexpr const char* kWindow = "Hinges that a code gives";
+
+void Mouse(CFrameView& view, QEvent::Type type, QPointF at, Qt::KeyboardModifiers with = {})
+{
+    QMouseEvent event(type, at, view.mapToGlobal(at), Qt::LeftButton, Qt::LeftButton, with);
+    QCoreApplication::sendEvent(&view, &event);
+}
+
+/// The line of an element, as the frame was drawn last.
+void ClickElement(CFrameView& view, int id)
+{
+    (void)view.grab();
+    for (int y = 0; y < view.height(); y += 2)
+        for (int x = 0; x < view.width(); x += 2) {
+            const long line = view.LineAt(QPointF(x, y));
+            if (line < 0 || view.Picture().scene->lines[static_cast<std::size_t>(line)].id != id)
+                continue;
+            Mouse(view, QEvent::MouseButtonPress, QPointF(x, y));
+            return Mouse(view, QEvent::MouseButtonRelease, QPointF(x, y));
+        }
+    ADD_FAILURE() << "element " << id << " is not to be seen";
+}
+
+class CodeHingeWindows : public DesktopTest {
+protected:
+    CodeHingeWindows()
+    {
+        EXPECT_TRUE(Open("rc-frame-code-hinges"));
+        CEditScope edit(m_main->Doc(), "Without hinges");
+        for (const auto& entry : std::map(Model().hinges))
+            EXPECT_TRUE(edit.Erase<T_PHGE_D>(entry.first));
+        for (const auto& entry : std::map(Model().hingeTypes))
+            EXPECT_TRUE(edit.Erase<T_PHGT_D>(entry.first));
+        EXPECT_TRUE(edit.Commit());
+    }
+    void Show(ACT act)
+    {
+        CPlay play({{kWindow, std::move(act)}});
+        Run("IDS_QM_UI_GEN_MENU");
+    }
+    std::vector<int> HingedElements()
+    {
+        std::vector<int> ids;
+        for (const auto& [key, hinge] : Model().hinges)
+            ids.push_back(hinge.element);
+        std::ranges::sort(ids);
+        return ids;
+    }
+};
+
+} // namespace
+
+TEST_F(CodeHingeWindows, MembersAreChosenOnTheFrameAndByTheirNumbers)
+{
+    Show([](CDialogWindow& w) {
+        auto* frame = dynamic_cast<CFrameView*>(Field(w, "frame"));
+        ASSERT_NE(nullptr, frame);
+        EXPECT_FALSE(Field(w, "IDS_QM_UI_GEN_PREVIEW")->isEnabled());
+        ClickElement(*frame, 12);
+        EXPECT_EQ("12", TextAt(w, "elements"));
+        ClickElement(*frame, 3);
+        EXPECT_EQ("3, 12", TextAt(w, "elements"));
+        ClickElement(*frame, 12);
+        EXPECT_EQ("3", TextAt(w, "elements"));
+        Push(w, "IDS_QM_UI_GEN_NONE");
+        EXPECT_EQ("", TextAt(w, "elements"));
+        const QPointF corner(frame->width() - 1.0, frame->height() - 1.0);
+        Mouse(*frame, QEvent::MouseButtonPress, QPointF(0, 0), Qt::ControlModifier);
+        Mouse(*frame, QEvent::MouseMove, corner, Qt::ControlModifier);
+        Mouse(*frame, QEvent::MouseButtonRelease, corner, Qt::ControlModifier);
+        EXPECT_EQ("1-6, 11-14", TextAt(w, "elements"));
+        Enter(w, "elements", "2, 5-6");
+        EXPECT_TRUE(Says(w, "3 elements are chosen"));
+        Cancel(w);
+    });
+}
+
+TEST_F(CodeHingeWindows, ThePreviewIsWhatIsStoredAndOneEdit)
+{
+    const long before = m_main->Doc().Data().Revision();
+    Show([&](CDialogWindow& w) {
+        auto* code = qobject_cast<QComboBox*>(Field(w, "code"));
+        ASSERT_NE(nullptr, code);
+        EXPECT_EQ("EN1998-3", code->currentText()); // the model's design codes are Eurocodes
+        Push(w, "IDS_QM_UI_GEN_ALL");
+        Push(w, "IDS_QM_UI_GEN_PREVIEW");
+        EXPECT_TRUE(Says(w, "10 elements would have hinges"));
+        EXPECT_EQ(before, m_main->Doc().Data().Revision());
+        QAbstractItemModel& types = Grid(w, "types").Model();
+        int beam = 0; // the type of beams: their strength does not follow the axial force
+        while (beam < types.rowCount() && Cell(types, beam, 0) != "beam 30x50")
+            ++beam;
+        ASSERT_LT(beam, types.rowCount());
+        Grid(w, "types").setCurrentIndex(types.index(beam, 0));
+        Settle();
+        EXPECT_EQ("11-14", Cell(types, beam, 2));
+        QAbstractItemModel& sides = Grid(w, "sides").Model();
+        ASSERT_EQ(2, sides.rowCount()); // hogging and sagging
+        const double moments[] = {Cell(sides, 0, 4).toDouble(), Cell(sides, 1, 4).toDouble()};
+        Grid(w, "sides").setCurrentIndex(sides.index(1, 0));
+        Settle();
+        QAbstractItemModel& trace = Grid(w, "trace").Model();
+        int row = 0;
+        while (row < trace.rowCount() && Cell(trace, row, 0) != "My")
+            ++row;
+        ASSERT_LT(row, trace.rowCount());
+        EXPECT_EQ(moments[1], Cell(trace, row, 1).toDouble());
+        EXPECT_EQ("kN m", Cell(trace, row, 2));
+        EXPECT_EQ("EN 1992-1-1 3.1.7, 6.1", Cell(trace, row, 4));
+        EXPECT_EQ("computed", Cell(trace, row, 5));
+        EXPECT_FALSE(Picture(w).series.empty());
+        // Another choice is not the one that was previewed.
+        ChooseIndex(code, 0);
+        EXPECT_EQ(0, types.rowCount());
+        ChooseIndex(code, 3);
+        Push(w, "IDS_QM_UI_GEN_APPLY");
+        EXPECT_TRUE(Says(w, "10 elements have hinges"));
+        for (const auto& [key, hinge] : Model().hinges)
+            if (hinge.element == 11) {
+                EXPECT_NEAR(moments[0], hinge.yield[4].pos / 1e3, 1e-3 * moments[0]);
+                EXPECT_NEAR(moments[1], hinge.yield[4].neg / 1e3, 1e-3 * moments[1]);
+            }
+        Cancel(w);
+    });
+    EXPECT_EQ((std::vector<int>{1, 2, 3, 4, 5, 6, 11, 12, 13, 14}), HingedElements());
+    Run("IDS_QM_UI_UNDO");
+    EXPECT_TRUE(Model().hinges.empty());
+    EXPECT_TRUE(Model().hingeTypes.empty());
+}
+
+TEST_F(CodeHingeWindows, StaleTypesAreMarkedAndMadeAgain)
+{
+    Show([](CDialogWindow& w) {
+        Enter(w, "elements", "11, 12");
+        EXPECT_FALSE(Field(w, "IDS_QM_UI_GEN_AGAIN")->isEnabled());
+        Push(w, "IDS_QM_UI_GEN_APPLY");
+        Cancel(w);
+    });
+    CDBDoc& doc = m_main->Doc();
+    T_SECT_D beam;
+    ASSERT_TRUE(doc.Attr().GetSect(2, beam));
+    beam.detailing->stirrupSpacing = 0.1;
+    {
+        CEditScope edit(doc, "Closer stirrups");
+        ASSERT_TRUE(edit.Put(2, beam) && edit.Commit());
+    }
+    const ACT list = [](CDialogWindow& w) {
+        CGridView& types = Grid(w, "types");
+        EXPECT_EQ("EN1998-3", Cell(types.Model(), 0, 2));
+        EXPECT_TRUE(
+            types.Model().index(0, 0).data(Qt::ToolTipRole).toString().contains("stale: section"));
+        Cancel(w);
+    };
+    {
+        CPlay play({{"Hinge types", list}});
+        Run("IDS_QM_UI_HINGE_TYPES");
+    }
+    Show([&](CDialogWindow& w) {
+        Push(w, "IDS_QM_UI_GEN_STALE_BTN");
+        EXPECT_EQ("11, 12", TextAt(w, "elements"));
+        Push(w, "IDS_QM_UI_GEN_AGAIN");
+        EXPECT_TRUE(Says(w, "2 elements have hinges of 1 types"));
+        EXPECT_FALSE(Field(w, "IDS_QM_UI_GEN_AGAIN")->isEnabled());
+        Cancel(w);
+    });
+    CGeneratedTypes types(doc);
+    for (const auto& [key, type] : Model().hingeTypes)
+        EXPECT_EQ("", types.Fault(key));
+    EXPECT_EQ((std::vector<int>{11, 12}), HingedElements());
+}
