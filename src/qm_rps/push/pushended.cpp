@@ -20,17 +20,17 @@ double LastDisplacement(IPushRun& run)
                                                   : run.Head().end.displacement;
 }
 
-/// Where the first leap has led to; SI.
-double FirstLeap(IPushRun& run)
+/// Where the first leap of the case has led to; SI.
+std::optional<double> FirstLeap(IPushRun& run)
 {
     std::vector<T_RUN_EVENT> events;
-    if (!run.ReadEvents(events)) return LastDisplacement(run);
+    if (!run.ReadEvents(events)) return std::nullopt;
     const auto leaps = [](const T_RUN_EVENT& event) {
         return std::ranges::find(event.turns, solver::HINGE_TURN::Leap, &T_RUN_TURN::turn) !=
                event.turns.end();
     };
     const auto first = std::ranges::find_if(events, leaps);
-    return first == events.end() ? LastDisplacement(run) : first->displacement;
+    return first == events.end() ? std::nullopt : std::optional(first->displacement);
 }
 
 /// In a load case that this one starts from. The present ones tell nothing of a run that is older
@@ -56,8 +56,9 @@ std::optional<T_PUSH_ENDED> PushEndedOf(CDBDoc& doc, int key, int turn)
     out.earlier = EndedEarlier(doc, key, turn, *run);
     if (out.earlier) out.status = PUSH_STATUS::Failed;
     const T_PUSH_QUANTITY length = DisplacementIn(DirectionOf(run->Head()), doc.Unit().Units());
-    const bool lept = end.outcome == solver::PUSH_OUTCOME::ReachedByLeaps;
-    out.displacement = length.Shown(lept ? FirstLeap(*run) : LastDisplacement(*run));
+    const std::optional<double> leap = FirstLeap(*run);
+    if (leap) out.leap = length.Shown(*leap);
+    out.displacement = length.Shown(LastDisplacement(*run));
     out.unit = length.Unit();
     return out;
 }
@@ -67,13 +68,25 @@ std::optional<zql::frx::T_MESSAGE> PushRemark(CDBDoc& doc, const std::string& pu
     const std::optional<T_PUSH_NAME> name = FindPush(doc.Data().Model(), push);
     if (!name) return std::nullopt;
     const std::optional<T_PUSH_ENDED> ended = PushEndedOf(doc, name->key, name->turn);
-    const bool lept = ended && ended->outcome == solver::PUSH_OUTCOME::ReachedByLeaps;
-    if (!ended || (ended->status != PUSH_STATUS::Failed && !lept)) return std::nullopt;
-    const char* const text = lept ? "IDS_QM_PUSH_CUT_LEAPS"
-                             : ended->outcome == solver::PUSH_OUTCOME::Cancelled
-                                 ? "IDS_QM_PUSH_CUT_CANCELLED"
-                             : ended->earlier ? "IDS_QM_PUSH_CUT_EARLIER"
-                                              : "IDS_QM_PUSH_CUT";
-    const std::string where = FormatText("%.6g", ended->displacement) + " " + ended->unit;
-    return zql::frx::T_MESSAGE{text, Say(text, push, where, PushOutcomeText(ended->outcome))};
+    if (!ended) return std::nullopt;
+    const auto at = [&](double displacement) {
+        return FormatText("%.6g", displacement) + " " + ended->unit;
+    };
+    std::string key, words;
+    const auto add = [&](const char* text, double displacement) {
+        if (key.empty()) key = text;
+        words += (words.empty() ? "" : " ") +
+                 Say(text, push, at(displacement), PushOutcomeText(ended->outcome));
+    };
+    if (ended->status == PUSH_STATUS::Failed)
+        add(ended->outcome == solver::PUSH_OUTCOME::Cancelled ? "IDS_QM_PUSH_CUT_CANCELLED"
+            : ended->earlier                                  ? "IDS_QM_PUSH_CUT_EARLIER"
+                                                              : "IDS_QM_PUSH_CUT",
+            ended->displacement);
+    if (ended->leap)
+        add("IDS_QM_PUSH_CUT_LEAPS", *ended->leap);
+    else if (ended->outcome == solver::PUSH_OUTCOME::ReachedByLeaps)
+        add("IDS_QM_PUSH_CUT_LEAPS_BEFORE", ended->displacement);
+    if (key.empty()) return std::nullopt;
+    return zql::frx::T_MESSAGE{key, words};
 }

@@ -11,10 +11,10 @@
 struct T_PUSH_ENDED {
     PUSH_STATUS status = PUSH_STATUS::Failed;
     solver::PUSH_OUTCOME outcome{};
-    bool earlier = false;      // already in a load case that this one starts from
-    double displacement = 0.0; // of the control at the last step (of a push with leaps, behind the
-                               // first of them), in current units
-    std::string unit;          // of the displacement
+    bool earlier = false;         // already in a load case that this one starts from
+    double displacement = 0.0;    // of the control at the last step, in current units
+    std::string unit;             // of the displacement
+    std::optional<double> leap{}; // displacement behind the first leap of the case; empty: none
 };
 
 /// turn: of the load case's static angle. Empty: imported steps, or no results.
