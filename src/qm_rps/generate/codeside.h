@@ -57,7 +57,13 @@ struct T_MEMBER_END {
     double tie = 0.0;    // of spandrels: strength of what ties the wall there; 0: nothing
     std::optional<T_PUSHED_SHEAR> pushed{}; // else V of both ends' strengths, shear span clear / 2
 
-    double ShearSpan() const { return pushed ? pushed->shearSpan : clear / 2.0; }
+    double shearSpan = 0.0;                 // M / V of a state; 0: of `pushed`, or clear / 2
+
+    double ShearSpan() const
+    {
+        if (shearSpan > 0.0) return shearSpan;
+        return pushed ? pushed->shearSpan : clear / 2.0;
+    }
     bool HasAxial() const { return IsUpright(kind); }
     /// Displacement of one end across the other under a shear force, bent by equal end moments.
     double Sway(double shear) const

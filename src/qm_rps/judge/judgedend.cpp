@@ -1,7 +1,9 @@
 #include "qm_rps/judge/judgedend.h"
 
 #include "qm_base/say.h"
+#include "qm_rps/codes/en1998backbone.h"
 #include "qm_rps/codes/en1998shear.h"
+#include "qm_rps/generate/rchinge.h"
 #include "qm_rps/push/lawaxial.h"
 
 #include <algorithm>
@@ -22,7 +24,7 @@ bool IsPositiveSide(const T_JUDGED_END& end, const T_END_STATE& s)
 /// M / V of a state on the sheet. A point without a moment close to the end does not make a member
 /// squat: at least the depth, or half the clear length where that is shorter. An end without forces
 /// (its hinge has lost them) has what hinges are generated with.
-double SpanOf(const T_RC_END& member, const T_END_STATE& s, double longest, const char* beyond,
+double SpanOf(const T_MEMBER_END& member, const T_END_STATE& s, double longest, const char* beyond,
               CCodeSheet& sheet)
 {
     constexpr double kNothing = 1e-9; // of b h fc: rounding
@@ -42,9 +44,9 @@ double SpanOf(const T_RC_END& member, const T_END_STATE& s, double longest, cons
 
 /// The end at the axial force of a state. Rotations go with the chord: it is no longer than the
 /// clear length.
-T_RC_END RotationEnd(const T_JUDGED_END& end, const T_END_STATE& s, CCodeSheet& sheet)
+T_MEMBER_END RotationEnd(const T_JUDGED_END& end, const T_END_STATE& s, CCodeSheet& sheet)
 {
-    T_RC_END member = end.member;
+    T_MEMBER_END member = end.member;
     member.axial = s.N;
     member.shearSpan =
         SpanOf(member, s, member.clear, "M/V beyond the clear length: clear length", sheet);
@@ -52,10 +54,10 @@ T_RC_END RotationEnd(const T_JUDGED_END& end, const T_END_STATE& s, CCodeSheet& 
 }
 
 /// The same for shear: of a moment without shear so long that no formula sees its end.
-T_RC_END ShearEnd(const T_JUDGED_END& end, const T_END_STATE& s, CCodeSheet& sheet)
+T_MEMBER_END ShearEnd(const T_JUDGED_END& end, const T_END_STATE& s, CCodeSheet& sheet)
 {
     constexpr double kFar = 1000.0; // clear lengths
-    T_RC_END member = end.member;
+    T_MEMBER_END member = end.member;
     member.axial = s.N;
     member.shearSpan = SpanOf(member, s, kFar * member.clear, "no shear", sheet);
     return member;
@@ -70,7 +72,7 @@ void KeepShear(const CCodeSheet& sheet, T_END_CHECKS& out)
 
 // ---- EN 1998-3, Circolare 2019 ------------------------------------------------------------------
 
-std::optional<T_EN_ROTATIONS> RotationsOf(const T_RC_END& member, bool positive, CCodeSheet& sheet)
+std::optional<T_EN_ROTATIONS> RotationsOf(const T_MEMBER_END& member, bool positive, CCodeSheet& sheet)
 {
     const std::optional<T_RC_BASIS> basis = RcBasis(member, positive, sheet);
     const auto en = basis ? EnMember(*basis, sheet) : std::nullopt;
@@ -83,7 +85,7 @@ std::optional<T_EN_ROTATIONS> RotationsOf(const T_RC_END& member, bool positive,
 }
 
 /// A free or pinned end turns without being bent.
-bool IsWithoutMoment(const T_RC_END& member, const T_END_STATE& s)
+bool IsWithoutMoment(const T_MEMBER_END& member, const T_END_STATE& s)
 {
     constexpr double kNothing = 1e-6;
     const double V = std::fabs(s.V);
@@ -93,11 +95,11 @@ bool IsWithoutMoment(const T_RC_END& member, const T_END_STATE& s)
 void ChordRotations(const T_JUDGED_END& end, const T_END_STATE& s, T_END_CHECKS& out)
 {
     CCodeSheet sheet;
-    const T_RC_END member = RotationEnd(end, s, sheet);
+    const T_MEMBER_END member = RotationEnd(end, s, sheet);
     out.LV = member.shearSpan;
     const auto found = RotationsOf(member, IsPositiveSide(end, s), sheet);
     if (!found) {
-        out.whyNoRotation = FaultOf(sheet);
+        out.whyNoRotation = ReasonOf(sheet);
         return;
     }
     const bool isFree = IsWithoutMoment(member, s);
@@ -120,12 +122,12 @@ void ChordShear(const T_JUDGED_END& end, const T_STATE_CONTEXT& with, T_END_CHEC
 {
     CCodeSheet sheet;
     const T_END_STATE& s = with.shear;
-    const T_RC_END member = ShearEnd(end, s, sheet);
+    const T_MEMBER_END member = ShearEnd(end, s, sheet);
     const std::optional<T_RC_BASIS> basis = RcBasis(member, IsPositiveSide(end, s), sheet);
     const auto en = basis ? EnMember(*basis, sheet) : std::nullopt;
     const auto yield = en ? EnYield(*en, sheet) : std::nullopt;
     if (!yield) {
-        out.whyNoShear = FaultOf(sheet);
+        out.whyNoShear = ReasonOf(sheet);
         return;
     }
     T_RC_MATERIAL material = basis->material;
@@ -142,7 +144,7 @@ void ChordShear(const T_JUDGED_END& end, const T_STATE_CONTEXT& with, T_END_CHEC
                                       std::max(0.0, out.ductility - 1.0), std::nullopt, sheet);
     const auto monotonic = cyclic ? EnMonotonicShear(*basis, material, sheet) : std::nullopt;
     if (!monotonic) {
-        out.whyNoShear = FaultOf(sheet);
+        out.whyNoShear = ReasonOf(sheet);
         return;
     }
     const double strength =
@@ -155,7 +157,7 @@ void ChordShear(const T_JUDGED_END& end, const T_STATE_CONTEXT& with, T_END_CHEC
 // ---- ASCE 41, FEMA 356 --------------------------------------------------------------------------
 
 /// Of the knowledge level; a material without one counts as the least known.
-double KappaOf(const T_RC_END& member, CCodeSheet& sheet)
+double KappaOf(const T_MEMBER_END& member, CCodeSheet& sheet)
 {
     const auto& level = member.material.knowledge;
     return AsceKappa(level ? static_cast<ASCE_KNOWLEDGE>(*level) : ASCE_KNOWLEDGE::Minimum, sheet);
@@ -164,10 +166,10 @@ double KappaOf(const T_RC_END& member, CCodeSheet& sheet)
 void PlasticRotations(const T_JUDGED_END& end, const T_END_STATE& s, T_END_CHECKS& out)
 {
     CCodeSheet sheet;
-    const T_RC_END member = ShearEnd(end, s, sheet);
-    T_SIDES<T_RC_SIDE> sides;
+    const T_MEMBER_END member = ShearEnd(end, s, sheet);
+    T_SIDES<T_CODE_SIDE> sides;
     if (!RcHinge(member, sides, out.whyNoRotation)) return;
-    const T_RC_SIDE& side = IsPositiveSide(end, s) ? sides.pos : sides.neg;
+    const T_CODE_SIDE& side = IsPositiveSide(end, s) ? sides.pos : sides.neg;
     if (!side.bone.acceptance) {
         out.whyNoRotation = Say("IDS_QM_GEN_NO_ANSWER");
         return;
@@ -197,7 +199,7 @@ void PlasticRotations(const T_JUDGED_END& end, const T_END_STATE& s, T_END_CHECK
 std::optional<double> ForceStrength(const T_JUDGED_END& end, const T_END_STATE& s, double ductility,
                                     CCodeSheet& sheet)
 {
-    const T_RC_END member = ShearEnd(end, s, sheet);
+    const T_MEMBER_END member = ShearEnd(end, s, sheet);
     const T_MATL_D& m = member.material;
     const std::optional<T_RC_BASIS> basis = RcBasis(member, IsPositiveSide(end, s), sheet);
     if (!basis || !sheet.Positive({{"fck", m.fck}, {"fyk", m.fyk}})) return {};
@@ -205,7 +207,7 @@ std::optional<double> ForceStrength(const T_JUDGED_END& end, const T_END_STATE& 
     lower.fc = sheet.Put("f'cL", m.fck, kDimStress, kForce, "lower bound: fck", R);
     lower.fyw = sheet.Put("fytL", m.fyk, kDimStress, kForce, "lower bound: fyk", R);
     std::optional<double> strength;
-    if (member.column) {
+    if (IsUpright(member.kind)) {
         if (const auto found = AsceColumnShearOf(*basis, lower, ductility, sheet))
             strength = found->strength;
     } else if (const auto found = AsceBeamShear(*basis, lower, sheet)) {
@@ -226,7 +228,7 @@ void ForceShear(const T_JUDGED_END& end, const T_STATE_CONTEXT& with, T_END_CHEC
     const double gravity = *with.gravityShear;
     const std::optional<double> strength = ForceStrength(end, with.shear, out.ductility, sheet);
     if (!strength) {
-        out.whyNoShear = FaultOf(sheet);
+        out.whyNoShear = ReasonOf(sheet);
         return;
     }
     constexpr std::array<double, kLevels> kChi{1.3, 1.3, 1.0}; // IO, LS, CP

@@ -74,9 +74,9 @@ public:
 private:
     void AddByCode(HINGE_CODE code, bool secondary)
     {
-        T_RC_MEMBER member;
+        T_HINGE_MEMBER member;
         if (!ReadMember(m_model, m_any.place.element, CInitialAxial(), member, m_any.why)) return;
-        m_any.column = member.column;
+        m_any.column = IsUpright(member.kind);
         for (const HINGE_COMPONENT component : member.bending)
             for (const bool atJ : {false, true}) {
                 const auto at = static_cast<std::size_t>(component);
@@ -85,7 +85,7 @@ private:
                     end.why = Say("IDS_QM_PUSH_HINGE_RELEASED");
                 } else {
                     end.basis = JUDGE_BASIS::Code;
-                    end.member = EndOf(m_model, member, code, secondary, component, 0.0);
+                    end.member = EndOf(m_model, member, {code, secondary}, component, !atJ, 0.0);
                     // Plastic rotations are those of a hinge: without one the demand is not known.
                     if (!IsChordCode(code) && end.hinge < 0) {
                         end.basis = JUDGE_BASIS::Nothing;
@@ -117,11 +117,11 @@ private:
 
     void AddNothing()
     {
-        T_RC_MEMBER member;
+        T_HINGE_MEMBER member;
         std::string ignored;
         HINGE_COMPONENT component = HINGE_COMPONENT::My;
         if (ReadMember(m_model, m_any.place.element, CInitialAxial(), member, ignored)) {
-            m_any.column = member.column;
+            m_any.column = IsUpright(member.kind);
             component = member.bending.front();
         }
         for (const bool atJ : {false, true})

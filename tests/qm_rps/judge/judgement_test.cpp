@@ -18,9 +18,9 @@ T_JUDGED_END Column(HINGE_CODE code)
     T_JUDGED_END end;
     end.basis = JUDGE_BASIS::Code;
     end.axes.length = 3.0;
-    T_RC_END& m = end.member;
+    T_MEMBER_END& m = end.member;
     m.code = code;
-    m.column = true;
+    m.kind = MEMBER_KIND::Column;
     m.clear = m.length = 3.0;
     m.EI = 15e9 * std::pow(0.4, 4) / 12.0;
     m.section.name = "column";
