@@ -57,7 +57,7 @@ struct T_MEMBER_END {
     double tie = 0.0;    // of spandrels: strength of what ties the wall there; 0: nothing
     std::optional<T_PUSHED_SHEAR> pushed{}; // else V of both ends' strengths, shear span clear / 2
 
-    double shearSpan = 0.0;                 // M / V of a state; 0: of `pushed`, or clear / 2
+    double shearSpan = 0.0; // M / V of a state; 0: of `pushed`, or clear / 2
 
     double ShearSpan() const
     {

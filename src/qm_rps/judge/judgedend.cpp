@@ -72,7 +72,8 @@ void KeepShear(const CCodeSheet& sheet, T_END_CHECKS& out)
 
 // ---- EN 1998-3, Circolare 2019 ------------------------------------------------------------------
 
-std::optional<T_EN_ROTATIONS> RotationsOf(const T_MEMBER_END& member, bool positive, CCodeSheet& sheet)
+std::optional<T_EN_ROTATIONS> RotationsOf(const T_MEMBER_END& member, bool positive,
+                                          CCodeSheet& sheet)
 {
     const std::optional<T_RC_BASIS> basis = RcBasis(member, positive, sheet);
     const auto en = basis ? EnMember(*basis, sheet) : std::nullopt;

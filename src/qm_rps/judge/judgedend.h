@@ -35,7 +35,7 @@ struct T_JUDGED_END {
     std::string storey; // empty: none
     JUDGE_BASIS basis = JUDGE_BASIS::Nothing;
     std::string why;                    // Nothing: the reason
-    T_MEMBER_END member;                    // Code
+    T_MEMBER_END member;                // Code
     T_SIDES<std::vector<double>> marks; // Criteria: deformations of the hinge at IO, LS, CP
     double spring = 0.0;                // stiffness of its hinge in series, 0: rigid until it flows
     long hinge = -1;                    // of the run
