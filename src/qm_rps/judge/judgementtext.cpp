@@ -112,12 +112,14 @@ std::vector<std::string> LimitCells(const T_JUDGEMENT& j, const T_JUDGED_LIMIT& 
     const auto shown = [&](std::optional<double> si) {
         return Number(si ? std::optional(FromSi(*si, j.units, kDimLength)) : si);
     };
-    const auto product = limit.factor && limit.demandPga
-                             ? std::optional(*limit.factor * *limit.demandPga)
-                             : std::nullopt;
-    const auto ratio = limit.capacity && limit.demand && *limit.demand > 0.0
-                           ? std::optional(*limit.capacity / *limit.demand)
-                           : std::nullopt;
+    const auto text = [](bool isKnown, double value) {
+        return isKnown ? Number(value) : Number(std::nullopt);
+    };
+    const double demand = limit.demand.value_or(0.0);
+    const std::string ratio =
+        text(limit.capacity && demand > 0.0, limit.capacity.value_or(0.0) / demand);
+    const std::string product = text(limit.factor && limit.demandPga,
+                                     limit.factor.value_or(0.0) * limit.demandPga.value_or(0.0));
     std::string remark = limit.why;
     if (limit.first.unchecked > 0 && limit.first.unchecked < j.ends.size())
         remark += (remark.empty() ? "" : "; ") +
@@ -127,9 +129,9 @@ std::vector<std::string> LimitCells(const T_JUDGEMENT& j, const T_JUDGED_LIMIT& 
             limit.first.end ? EndText(j.ends[*limit.first.end]) : "-",
             shown(limit.capacity),
             shown(limit.demand),
-            Number(ratio),
+            ratio,
             Number(limit.factor),
-            Number(product),
+            product,
             Number(limit.demandPga),
             remark};
 }
