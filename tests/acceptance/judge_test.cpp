@@ -161,7 +161,7 @@ TEST_F(Judge, TableReportSheetAndPictureTellTheSame)
     ExpectHolds(Text("p.svg"), {"<svg"});
     ExpectRefused("judge g.json --sheet s.xlsx", 4, "s.xlsx");
     if (!COffice::IsThere()) GTEST_SKIP() << "soffice or python3 is not installed";
-    const OFFICE_CELLS cells = COffice().Recalculated((m_folder / "s.xlsx").string());
+    const OFFICE_CELLS cells = COffice().Recalculated(m_folder / "s.xlsx");
     ASSERT_LT(13U, cells.size()); // heads in row 8, six rows below: three states, two ends
     std::size_t rows = 0;
     for (const json& state : judged.at("limit_states"))
