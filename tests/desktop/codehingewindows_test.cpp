@@ -106,13 +106,11 @@ TEST_F(CodeHingeWindows, ThePreviewIsWhatIsStoredAndOneEdit)
             ++beam;
         ASSERT_LT(beam, types.rowCount());
         Grid(w, "types").setCurrentIndex(types.index(beam, 0));
-        Settle();
         EXPECT_EQ("11-14", Cell(types, beam, 2));
         QAbstractItemModel& sides = Grid(w, "sides").Model();
         ASSERT_EQ(2, sides.rowCount()); // hogging and sagging
         const double moments[] = {Cell(sides, 0, 4).toDouble(), Cell(sides, 1, 4).toDouble()};
         Grid(w, "sides").setCurrentIndex(sides.index(1, 0));
-        Settle();
         QAbstractItemModel& trace = Grid(w, "trace").Model();
         int row = 0;
         while (row < trace.rowCount() && Cell(trace, row, 0) != "My")
