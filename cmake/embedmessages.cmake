@@ -9,7 +9,7 @@ foreach(file IN LISTS CATALOGUES)
   if(NOT clash EQUAL -1)
     message(FATAL_ERROR "${file}: contains the mark that ends an embedded text")
   endif()
-  string(APPEND rows "    {\"${language}\", R\"qm_text(${text})qm_text\"},\n")
+  string(APPEND rows "    {\"${language}\", R\"qm_text(${text})qm_text\"sv},\n")
 endforeach()
 
 file(WRITE ${OUTPUT} "// Made from the message catalogues by embedmessages.cmake.
@@ -18,6 +18,9 @@ file(WRITE ${OUTPUT} "// Made from the message catalogues by embedmessages.cmake
 namespace zql::lib {
 
 namespace {
+
+// The compiler knows the length of such a literal; counting it would exceed the steps clang allows in a constant.
+using namespace std::string_view_literals;
 
 constexpr T_MESSAGE_SOURCE kSources[] = {
 ${rows}};
