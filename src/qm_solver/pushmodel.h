@@ -54,6 +54,20 @@ struct T_HINGE_LAW {
     std::vector<T_AXIAL_STRENGTH> byAxial;
 };
 
+/// Corners of the polygon that the moments of a biaxial hinge stay in, at fixed directions of
+/// (My / strength, Mz / strength); five in each quadrant.
+inline constexpr std::size_t kBiaxialCorners = 20;
+/// Angles of the corners, from the axis of My to that of Mz, rising. The first and the last of a
+/// quadrant stand beside the axes.
+std::array<double, kBiaxialCorners> BiaxialCorners();
+
+/// At an axial force, tension positive: how far the corners lie from the centre, as shares of the
+/// ellipse there.
+struct T_AXIAL_SHAPE {
+    double axial = 0.0;
+    std::array<double, kBiaxialCorners> share{};
+};
+
 enum class HINGE_FLOW {
     Rotations,  // the components of the law alone flow, whatever the axial force does
     Associated, // normal to the yield surface
@@ -67,6 +81,10 @@ struct T_PUSH_HINGE {
     /// The laws of My and Mz share one surface: (My / strength)^2 + (Mz / strength)^2 = 1 as a
     /// polygon that is drawn inside it; deformations by the law of the larger share.
     bool biaxial = false;
+    /// Of a biaxial hinge: another surface than the ellipse. One row counts at every axial force;
+    /// more are ascending, their polygons convex, and the inverse of the shares is straight between
+    /// them. Beyond the rows the run ends. Empty: the ellipse.
+    std::vector<T_AXIAL_SHAPE> shape;
     HINGE_FLOW flow = HINGE_FLOW::Rotations;
 };
 

@@ -73,6 +73,28 @@ T_REASON LawFault(const T_HINGE_LAW& law)
     return {};
 }
 
+/// Rows ascend, every corner stands out beyond the line between its neighbours.
+bool IsShape(const std::vector<T_AXIAL_SHAPE>& rows)
+{
+    const auto corners = BiaxialCorners();
+    constexpr double kStraight = 1e-9;
+    for (std::size_t r = 0; r < rows.size(); ++r) {
+        if (!std::isfinite(rows[r].axial) || (r > 0 && !(rows[r].axial > rows[r - 1].axial)))
+            return false;
+        for (std::size_t k = 0; k < kBiaxialCorners; ++k) {
+            const std::size_t a = (k + kBiaxialCorners - 1) % kBiaxialCorners;
+            const std::size_t b = (k + 1) % kBiaxialCorners;
+            const auto& share = rows[r].share;
+            if (!(share[k] > 0.0) || !std::isfinite(share[k])) return false;
+            const double line = std::sin(corners[b] - corners[k]) / share[a] +
+                                std::sin(corners[k] - corners[a]) / share[b];
+            if (std::sin(corners[b] - corners[a]) / share[k] > line * (1.0 + kStraight))
+                return false;
+        }
+    }
+    return true;
+}
+
 } // namespace
 
 std::optional<T_SOLVER_ERROR> CheckHinges(const T_PUSH_MODEL& model)
@@ -83,6 +105,7 @@ std::optional<T_SOLVER_ERROR> CheckHinges(const T_PUSH_MODEL& model)
         T_REASON reason;
         const bool isThere = hinge.element < model.frame.elements.size();
         if (!isThere || !(hinge.at >= 0.0 && hinge.at <= 1.0)) reason = "IDS_QM_ENGINE_HINGE_PLACE";
+        if (!reason && !IsShape(hinge.shape)) reason = "IDS_QM_ENGINE_HINGE_SHAPE";
         for (std::size_t l = 0; l < hinge.laws.size() && !reason; ++l) {
             const T_HINGE_LAW& law = hinge.laws[l];
             const T_ELEMENT& element = model.frame.elements[hinge.element];

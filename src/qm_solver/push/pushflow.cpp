@@ -1,5 +1,6 @@
 #include "qm_solver/push/pushflow.h"
 
+#include <algorithm>
 #include <cmath>
 #include <numbers>
 
@@ -7,7 +8,8 @@ namespace solver {
 
 namespace {
 
-constexpr double kCorner = 1e-9; // width of a corner over that of the line
+constexpr double kCorner = 1e-9;    // width of a corner over that of the line
+constexpr std::size_t kNormals = 2; // of the lines: where the parts of the normal begin
 
 } // namespace
 
@@ -65,6 +67,7 @@ void CPushFlow::SetSide(std::size_t row, bool isPositive, std::size_t axialRow, 
     m_normal[0] = isPositive ? 1.0 : -1.0;
     m_axialRow = axialRow;
     m_lines[0] = std::move(ratio);
+    m_hangs = m_lines[0].IsGiven();
 }
 
 void CPushFlow::SetFace(std::array<std::size_t, 2> rows, std::array<double, 2> normal,
@@ -74,25 +77,60 @@ void CPushFlow::SetFace(std::array<std::size_t, 2> rows, std::array<double, 2> n
     m_rows = rows;
     m_count = 2;
     m_normal = normal;
+    m_leading = std::fabs(normal[1]) > std::fabs(normal[0]) ? 1 : 0;
     m_distance = distance;
     m_strength = strength;
     m_axialRow = axialRow;
-    m_lines = std::move(ratios);
+    for (std::size_t k = 0; k < 2; ++k)
+        m_lines[k] = std::move(ratios[k]);
+    m_hangs = m_lines[0].IsGiven() || m_lines[1].IsGiven();
 }
 
-/// The component whose strength the condition is measured by; of a side the one it has.
-std::size_t CPushFlow::Leading() const
+void CPushFlow::SetNormal(std::array<double, 2> normal, std::array<CAxialLine, 2> byAxial)
 {
-    return m_count == 2 && std::fabs(m_normal[1]) > std::fabs(m_normal[0]) ? 1 : 0;
+    m_normal = normal;
+    for (std::size_t k = 0; k < 2; ++k) {
+        m_hangs = m_hangs || byAxial[k].IsGiven();
+        m_lines[kNormals + k] = std::move(byAxial[k]);
+    }
+}
+
+std::array<double, 4> CPushFlow::Slopes() const
+{
+    std::array<double, 4> slopes{};
+    for (std::size_t i = 0; i < slopes.size(); ++i)
+        slopes[i] = m_lines[i].Slope();
+    return slopes;
+}
+
+double CPushFlow::Normal(std::size_t k, double axial) const
+{
+    const CAxialLine& line = m_lines[kNormals + k];
+    return line.IsGiven() ? line.Value(axial) : m_normal[k];
+}
+
+/// Strength of the leading component over that of component k.
+double CPushFlow::Strengths(std::size_t k, double axial) const
+{
+    const double ratio = force / m_strength[k];
+    return k == m_leading ? ratio
+                          : ratio * m_lines[m_leading].Value(axial) / m_lines[k].Value(axial);
 }
 
 /// Of the force of row k in the value.
 double CPushFlow::Weight(std::size_t k, double axial) const
 {
-    if (m_count == 1) return m_normal[0];
-    const double weight = m_normal[k] * force / m_strength[k];
-    const std::size_t leading = Leading();
-    return k == leading ? weight : weight * m_lines[leading].Value(axial) / m_lines[k].Value(axial);
+    return m_count == 1 ? m_normal[0] : Normal(k, axial) * Strengths(k, axial);
+}
+
+/// Derivative of the weight by the axial force, of a face.
+double CPushFlow::WeightSlope(std::size_t k, double axial) const
+{
+    double slope = m_lines[kNormals + k].Slope();
+    if (k != m_leading)
+        slope += Normal(k, axial) * (m_lines[m_leading].Slope() / m_lines[m_leading].Value(axial) -
+                                     m_lines[k].Slope() / m_lines[k].Value(axial));
+    return slope * Strengths(k, axial);
 }
 
 double CPushFlow::Value(std::span<const double> s) const
@@ -105,7 +143,7 @@ double CPushFlow::Value(std::span<const double> s) const
 
 double CPushFlow::Scale(std::span<const double> s) const
 {
-    return m_distance * m_lines[Leading()].Value(Axial(s));
+    return m_distance * m_lines[m_leading].Value(Axial(s));
 }
 
 std::span<const T_FLOW_TERM> CPushFlow::Gradient(std::span<const double> s, double resistance) const
@@ -114,13 +152,9 @@ std::span<const T_FLOW_TERM> CPushFlow::Gradient(std::span<const double> s, doub
     for (std::size_t k = 0; k < m_count; ++k)
         m_gradient[k] = {m_rows[k], Weight(k, axial)};
     if (!HangsOnAxial()) return {m_gradient.data(), m_count};
-    const std::size_t leading = Leading(), other = 1 - leading;
-    const double slope = m_lines[leading].Slope();
-    double byAxial = -m_distance * slope * resistance;
-    if (m_count == 2)
-        byAxial += Weight(other, axial) * s[m_rows[other]] *
-                   (slope / m_lines[leading].Value(axial) -
-                    m_lines[other].Slope() / m_lines[other].Value(axial));
+    double byAxial = -m_distance * m_lines[m_leading].Slope() * resistance;
+    for (std::size_t k = 0; k < m_count && m_count == 2; ++k)
+        byAxial += WeightSlope(k, axial) * s[m_rows[k]];
     m_gradient[m_count] = {m_axialRow, byAxial};
     return {m_gradient.data(), m_count + 1};
 }
@@ -152,8 +186,29 @@ bool Flows(const T_HINGE_SIDE& side)
 }
 
 constexpr double kAcross = 3.0 * std::numbers::pi / 180.0; // half a face across an axis
-constexpr int kChords = 4;                                 // between two of them
+constexpr std::size_t kChords = 4;                         // between two of them
 constexpr double kLeastShare = 1e-9;                       // of a normal: less is rounding
+
+/// The normal of a face of a biaxial hinge, for strengths of 1.
+struct T_NORMAL {
+    std::array<double, 2> fixed{};
+    std::array<CAxialLine, 2> byAxial; // of what changes
+};
+T_NORMAL NormalOf(std::size_t face, double distance, const std::vector<T_AXIAL_SHAPE>& shape)
+{
+    T_NORMAL out;
+    for (std::size_t k = 0; k < 2; ++k) {
+        std::vector<CAxialLine::T_POINT> points;
+        for (const T_AXIAL_SHAPE& row : shape)
+            points.push_back({row.axial, distance * FaceNormal(face, row.share)[k]});
+        const auto [low, high] =
+            std::ranges::minmax_element(points, {}, &CAxialLine::T_POINT::strength);
+        out.fixed[k] = std::fabs(low->strength) < kLeastShare ? 0.0 : low->strength;
+        if (high->strength - low->strength > kLeastShare)
+            out.byAxial[k] = CAxialLine(std::move(points));
+    }
+    return out;
+}
 
 class CFlowMaker {
 public:
@@ -218,11 +273,13 @@ private:
     void AddFaces(std::size_t h, const T_BENDING& bending)
     {
         const std::size_t first = m_out.flows.size();
-        for (const T_FACE& face : BiaxialFaces()) {
+        const std::vector<T_FACE> faces = BiaxialFaces();
+        for (std::size_t i = 0; i < faces.size(); ++i) {
+            const T_FACE& face = faces[i];
             std::array<double, 2> normal{std::cos(face.angle), std::sin(face.angle)};
             for (double& n : normal)
                 if (std::fabs(n) < kLeastShare) n = 0.0; // across an axis
-            const std::size_t larger = std::fabs(normal[0]) >= std::fabs(normal[1]) ? 0 : 1;
+            const std::size_t larger = std::fabs(normal[1]) > std::fabs(normal[0]) ? 1 : 0;
             std::array<double, 2> strength{};
             std::array<CAxialLine, 2> lines;
             for (std::size_t k = 0; k < 2; ++k) {
@@ -235,6 +292,10 @@ private:
             flow.SetFace({m_structure.RowOf(h, bending[0]), m_structure.RowOf(h, bending[1])},
                          normal, face.distance, strength, m_structure.AxialRow(h),
                          std::move(lines));
+            const std::vector<T_AXIAL_SHAPE>& shape = m_model.hinges[h].shape;
+            if (shape.empty()) continue;
+            T_NORMAL own = NormalOf(i, face.distance, shape);
+            flow.SetNormal(own.fixed, std::move(own.byAxial));
         }
         ShareFlows(first);
     }
@@ -261,16 +322,37 @@ private:
 
 } // namespace
 
-std::vector<T_FACE> BiaxialFaces()
+std::array<double, kBiaxialCorners> BiaxialCorners()
 {
     constexpr double kQuarter = std::numbers::pi / 2.0;
-    const double corner = 1.0 / std::cos(kAcross), chord = (kQuarter - 2.0 * kAcross) / kChords;
+    constexpr double kChord = (kQuarter - 2.0 * kAcross) / kChords;
+    std::array<double, kBiaxialCorners> corners{};
+    static_assert(kBiaxialCorners == 4 * (kChords + 1));
+    for (std::size_t i = 0; i < corners.size(); ++i)
+        corners[i] = static_cast<double>(i / (kChords + 1)) * kQuarter + kAcross +
+                     static_cast<double>(i % (kChords + 1)) * kChord;
+    return corners;
+}
+
+std::array<double, 2> FaceNormal(std::size_t k, const std::array<double, kBiaxialCorners>& share)
+{
+    const auto corners = BiaxialCorners();
+    const std::size_t a = (k + kBiaxialCorners - 1) % kBiaxialCorners;
+    // n . (cos, sin) of a corner = 1 over its distance from the centre.
+    const double first = std::cos(kAcross) / share[a], second = std::cos(kAcross) / share[k];
+    const double turn = std::sin(corners[k] - corners[a]);
+    return {(first * std::sin(corners[k]) - second * std::sin(corners[a])) / turn,
+            (second * std::cos(corners[a]) - first * std::cos(corners[k])) / turn};
+}
+
+std::vector<T_FACE> BiaxialFaces()
+{
+    std::array<double, kBiaxialCorners> ellipse;
+    ellipse.fill(1.0);
     std::vector<T_FACE> faces;
-    for (int q = 0; q < 4; ++q) {
-        faces.push_back({q * kQuarter, 1.0});
-        for (int c = 0; c < kChords; ++c)
-            faces.push_back(
-                {q * kQuarter + kAcross + (c + 0.5) * chord, corner * std::cos(0.5 * chord)});
+    for (std::size_t k = 0; k < kBiaxialCorners; ++k) {
+        const std::array<double, 2> n = FaceNormal(k, ellipse);
+        faces.push_back({std::atan2(n[1], n[0]), 1.0 / std::hypot(n[0], n[1])});
     }
     return faces;
 }

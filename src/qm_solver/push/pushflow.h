@@ -68,6 +68,8 @@ public:
     void SetFace(std::array<std::size_t, 2> rows, std::array<double, 2> normal, double distance,
                  std::array<double, 2> strength, std::size_t axialRow,
                  std::array<CAxialLine, 2> ratios);
+    /// Another normal of the face, its distance kept; by axial force where a line is given.
+    void SetNormal(std::array<double, 2> normal, std::array<CAxialLine, 2> byAxial);
 
     double Value(std::span<const double> s) const;
     double Scale(std::span<const double> s) const;
@@ -76,22 +78,30 @@ public:
     /// Plastic deformation of rows by unit flow.
     std::span<const T_FLOW_TERM> Direction(std::span<const double> s, double resistance) const;
 
-    bool HangsOnAxial() const { return m_lines[0].IsGiven() || m_lines[1].IsGiven(); }
+    /// Strengths over those of the backbones, then parts of the normal.
+    using T_LINES = std::array<CAxialLine, 4>;
+    bool HangsOnAxial() const { return m_hangs; }
     std::size_t AxialRow() const { return m_axialRow; }
-    std::array<CAxialLine, 2>& Lines() { return m_lines; }
-    const std::array<CAxialLine, 2>& Lines() const { return m_lines; }
+    T_LINES& Lines() { return m_lines; }
+    const T_LINES& Lines() const { return m_lines; }
+    /// Slopes of the parts of the lines that count now.
+    std::array<double, 4> Slopes() const;
     std::span<const std::size_t> Rows() const { return {m_rows.data(), m_count}; }
 
 private:
-    std::size_t Leading() const;
+    double Normal(std::size_t k, double axial) const;
+    double Strengths(std::size_t k, double axial) const;
     double Weight(std::size_t k, double axial) const;
+    double WeightSlope(std::size_t k, double axial) const;
     double Axial(std::span<const double> s) const { return HangsOnAxial() ? s[m_axialRow] : 0.0; }
 
     std::array<std::size_t, 2> m_rows{};
     std::size_t m_count = 1, m_axialRow = 0;
+    std::size_t m_leading = 0; // the component whose strength the condition is measured by
     std::array<double, 2> m_normal{1.0, 0.0}, m_strength{1.0, 1.0};
     double m_distance = 1.0;
-    std::array<CAxialLine, 2> m_lines;
+    T_LINES m_lines;
+    bool m_hangs = false;
     mutable std::array<T_FLOW_TERM, 3> m_gradient{}, m_direction{}; // of the last call
 };
 
@@ -102,13 +112,16 @@ struct T_PUSH_FLOWS {
 };
 T_PUSH_FLOWS MakeFlows(const T_PUSH_MODEL& model, const CPushStructure& structure);
 
-/// A face of the polygon of a biaxial hinge, for strengths of 1: angle of its normal, from the axis
-/// of My to that of Mz, and distance from the centre.
+/// A face of the polygon of a biaxial hinge: angle of its normal, from the axis of My to that of
+/// Mz, distance from the centre.
 struct T_FACE {
     double angle, distance;
 };
-/// Faces across the axes, so that bending about one axis alone flows about it alone, with its full
-/// strength; between them chords of the ellipse. Within +0.14 and -1.6 % of it.
+/// Faces for strengths of 1: across the axes, so that bending about one axis alone flows about it
+/// alone, with its full strength; between them chords of the ellipse. Within +0.14 and -1.6 % of
+/// it. Face k lies between the corners k - 1 and k.
 std::vector<T_FACE> BiaxialFaces();
+/// Normal of face k over its distance, for corners at these shares of the ellipse.
+std::array<double, 2> FaceNormal(std::size_t k, const std::array<double, kBiaxialCorners>& share);
 
 } // namespace solver

@@ -24,6 +24,9 @@ CPushPath::CPushPath(const T_PUSH_MODEL& model, CPushStructure& structure)
 {
     m_isCurved = std::any_of(m_flows.flows.begin(), m_flows.flows.end(),
                              [](const CPushFlow& flow) { return flow.HangsOnAxial(); });
+    m_isBent = std::any_of(m_flows.flows.begin(), m_flows.flows.end(), [](const CPushFlow& flow) {
+        return flow.HangsOnAxial() && flow.Rows().size() > 1;
+    });
     m_soft.assign(m_flows.flows.size(), 0.0);
     m_lock.resize(m_flows.flows.size());
     FindOpposites();
@@ -229,6 +232,18 @@ void CPushPath::Advance(double by)
     MoveFlows(m_rate.flow, m_rate.force, by);
     for (T_WATCH& w : m_watches)
         w.value += by * w.rate;
+}
+
+double CPushPath::Recede(double by)
+{
+    double back = 0.0;
+    for (int tries = 0; m_isBent && tries < kMostCorrections; ++tries) {
+        const double left = NextEvent(by + back);
+        if (!(left < -kNear * by)) break;
+        Advance(left);
+        back += left;
+    }
+    return back;
 }
 
 long CPushPath::Turn()

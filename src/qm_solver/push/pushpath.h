@@ -106,6 +106,10 @@ public:
     bool LoadGrows() const { return LoadRate() > 0.0 || (m_rate.factor > 0.0 && m_norm == 0.0); }
     /// Conditions hang on the axial force in more than a straight way: steps need Correct.
     bool IsCurved() const { return m_isCurved; }
+    /// Behind an Advance by so much: goes back to the first condition that was met before, and says
+    /// how far, as a number below 0; 0 where none was. The rates tell of a condition that
+    /// multiplies moment and axial force (My and Mz under an axial force) to the first order alone.
+    double Recede(double by);
 
 private:
     struct T_COLUMN {
@@ -240,7 +244,8 @@ private:
     std::map<std::size_t, T_WAS> m_touched; // flows that change at this event
     std::vector<T_HINGE_EVENT> m_turned;
     bool m_isCurved = false;
-    int m_border = 0; // which row borders the system: 0 control, 1 load factor, 2 flows
+    bool m_isBent = false; // some condition multiplies forces
+    int m_border = 0;      // which row borders the system: 0 control, 1 load factor, 2 flows
 };
 
 } // namespace solver

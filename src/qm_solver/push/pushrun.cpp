@@ -323,14 +323,18 @@ CPushRun::T_FAULT CPushRun::Follow(const T_PUSH_STAGE& stage, int number, T_PUSH
         }
         T_PUSH_END stop;
         const bool isBehind = IsBehind(stage);
-        const double toEvent = m_path->NextEvent(), toTarget = ToTarget(stage),
-                     toStop = number < 0 || isBehind ? CHingeBackbone::kFar : ToStop(stage, stop),
-                     toReturn = isBehind ? ToReturn(stage) : CHingeBackbone::kFar;
+        double toEvent = m_path->NextEvent(), toTarget = ToTarget(stage),
+               toStop = number < 0 || isBehind ? CHingeBackbone::kFar : ToStop(stage, stop),
+               toReturn = isBehind ? ToReturn(stage) : CHingeBackbone::kFar;
         std::size_t extra = 0;
-        const double toExtra = number < 0 || isBehind ? CHingeBackbone::kFar : ToExtra(extra);
+        double toExtra = number < 0 || isBehind ? CHingeBackbone::kFar : ToExtra(extra);
         const double by = std::min({toEvent, toTarget, toStop, toReturn, toExtra});
         if (!(by < CHingeBackbone::kFar)) return finish(PUSH_OUTCOME::NoPath);
         m_path->Advance(by);
+        if (m_path->Recede(by) < 0.0) {
+            toEvent = by;
+            toTarget = toStop = toReturn = toExtra = CHingeBackbone::kFar;
+        }
         if (!isBehind) m_peak.reaction = std::max(m_peak.reaction, m_sign * Reaction(stage));
         if (!byLoad && m_sign * (Present(stage) - m_far) > 0.0) m_far = Present(stage);
         if (toReturn <= by) m_far = Present(stage);

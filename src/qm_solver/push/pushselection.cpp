@@ -167,11 +167,9 @@ std::vector<CPushPath::T_CHANGE> CPushPath::Violations()
         CPushFlow& flow = m_flows.flows[f];
         const CHingeBackbone& backbone = m_flows.backbones[flow.backbone];
         if (flow.HangsOnAxial()) {
-            const double slope = flow.Lines()[0].Slope(), other = flow.Lines()[1].Slope();
+            const auto slopes = flow.Slopes();
             ChoosePart(f);
-            if (IsMoving(f) &&
-                (slope != flow.Lines()[0].Slope() || other != flow.Lines()[1].Slope()))
-                out.push_back({f, 0.0, KIND::Part});
+            if (IsMoving(f) && slopes != flow.Slopes()) out.push_back({f, 0.0, KIND::Part});
         }
         if (IsMoving(f)) {
             const double rate = FlowRate(f) * flow.stiffness / flow.force;

@@ -194,6 +194,54 @@ TEST(PushLaws, BiaxialHingeTurnsAboutOneAxisAsOneOfThatAxis)
         }
 }
 
+/// Shares 1, 0.886, 0.85, 0.886, 1 in each quadrant at a compression of 200, the ellipse at a
+/// tension of 200, their inverses straight between.
+TEST(PushLaws, BiaxialHingeHasTheSurfaceThatIsGiven)
+{
+    const double degree = std::acos(-1.0) / 180.0, cos3 = std::cos(3.0 * degree);
+    T_AXIAL_SHAPE low{-200.0, {}}, high{200.0, {}};
+    for (std::size_t k = 0; k < kBiaxialCorners; ++k) {
+        low.share[k] = std::array{1.0, 0.886, 0.85, 0.886, 1.0}[k % 5];
+        high.share[k] = 1.0;
+    }
+    const auto inverse = [](double share, double axial) {
+        const double part = (axial + 200.0) / 400.0;
+        return (1.0 - part) / share + part;
+    };
+    struct T_CASE {
+        double angle, initial, vertical; // vertical: part of the pushing loads
+    };
+    for (const T_CASE& c : {T_CASE{45.0, -100.0, 0.0},
+                            {225.0, -100.0, 0.0},
+                            {13.5, -100.0, 0.0},
+                            {0.0, -100.0, 0.0},
+                            {45.0, 0.0, 0.5},
+                            {135.0, -40.0, -0.5},
+                            {45.0, -40.0, -0.5}})
+        for (const HINGE_FLOW flow : {HINGE_FLOW::Rotations, HINGE_FLOW::Associated}) {
+            T_PUSH_MODEL model = BiaxialColumn(Side({{0, 100}}), true);
+            model.hinges[0].shape = {low, high};
+            model.hinges[0].flow = flow;
+            model.initial.nodal = {{1, {0, 0, c.initial, 0, 0, 0}}};
+            const double angle = c.angle * degree;
+            T_PUSH_STAGE stage = PushTo(std::cos(angle) < 0.0 ? -3.0 : 3.0);
+            stage.loads.nodal[0].load = {std::cos(angle), std::sin(angle), c.vertical, 0, 0, 0};
+            const T_PUSHED run = Pushed(model, {stage});
+            ASSERT_TRUE(run.done) << run.error.reason.key;
+            const double axial = c.initial + c.vertical * run.end.loadFactor;
+            const double strength = 100.0 - (axial > 0.0 ? 0.5 : -0.25) * axial;
+            double over = inverse(0.85, axial) * cos3; // strength over moment
+            if (c.angle == 0.0) over = 1.0;
+            if (c.angle == 13.5) // on the chord between the corners at 3 and 24 degrees
+                over = (1.0 + inverse(0.886, axial)) * cos3 / (2.0 * std::cos(10.5 * degree));
+            EXPECT_NEAR(2.0 * run.end.loadFactor * over, strength, 1e-7) << c.angle;
+        }
+    T_PUSH_MODEL dented = BiaxialColumn(Side({{0, 100}}), true);
+    low.share[2] = 0.8; // within the line between its neighbours, 0.886 cos 21 = 0.827
+    dented.hinges[0].shape = {low, high};
+    EXPECT_EQ(Pushed(dented, {PushTo(1.0)}).error.reason.key, "IDS_QM_ENGINE_HINGE_SHAPE");
+}
+
 /// Across both axes two faces flow alike; each takes its part of the whole rotation, so that C is
 /// there at 0.1 / cos(10.5 degrees), half a chord away from both normals, and not at twice 0.1.
 TEST(PushLaws, FacesOfABiaxialHingeShareItsRotation)
