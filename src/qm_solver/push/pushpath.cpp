@@ -234,18 +234,6 @@ void CPushPath::Advance(double by)
         w.value += by * w.rate;
 }
 
-double CPushPath::Recede(double by)
-{
-    double back = 0.0;
-    for (int tries = 0; m_isBent && tries < kMostCorrections; ++tries) {
-        const double left = NextEvent(by + back);
-        if (!(left < -kNear * by)) break;
-        Advance(left);
-        back += left;
-    }
-    return back;
-}
-
 long CPushPath::Turn()
 {
     const double least = Least();
@@ -294,7 +282,9 @@ long CPushPath::Turn()
             if (line.IsGiven() && goes != 0.0 && line.IsLast(goes) &&
                 std::fabs(line.Corner(goes) - axial) <= kNear * line.Width())
                 outside = static_cast<long>(flow.hinge);
+        const auto slopes = flow.Slopes();
         ChoosePart(f);
+        if (IsActive(f) && slopes != flow.Slopes()) Touch(f); // another row of the system
     }
     TakeDrive(begun);
     return outside;

@@ -8,6 +8,13 @@ namespace solver {
 
 using ON = CHingeBackbone::ON;
 
+namespace {
+
+constexpr double kArrived = 1e-10; // of a way: back at an event
+constexpr int kMostTurnsBack = 12;
+
+} // namespace
+
 int CPushPath::SolveDirection(std::vector<double>& x)
 {
     if (m_system.Direction(x)) return 1;
@@ -164,6 +171,18 @@ int CPushPath::MakeRates()
     RatesOf(x, 1.0);
     if (DriveSign() < 0.0) RatesOf(x, -1.0);
     return 1;
+}
+
+double CPushPath::Recede(double by)
+{
+    double back = 0.0;
+    for (int tries = 0; m_isBent && tries < kMostTurnsBack; ++tries) {
+        const double left = NextEvent(by + back);
+        if (!(left < -kArrived * by)) break;
+        Advance(left);
+        back += left;
+    }
+    return back;
 }
 
 } // namespace solver
