@@ -227,3 +227,14 @@ int StrengthsByAxial(const T_AXIAL_BASIS& basis, std::vector<solver::T_AXIAL_STR
     if (done) out = std::move(rows);
     return done;
 }
+
+T_SIDES<double> StrengthAt(std::span<const solver::T_AXIAL_STRENGTH> rows, double axial)
+{
+    const auto above = std::ranges::lower_bound(rows, axial, {}, &solver::T_AXIAL_STRENGTH::axial);
+    if (above == rows.end()) return {rows.back().positive, rows.back().negative};
+    if (above == rows.begin()) return {above->positive, above->negative};
+    const auto& below = *(above - 1);
+    const double part = (axial - below.axial) / (above->axial - below.axial);
+    return {std::lerp(below.positive, above->positive, part),
+            std::lerp(below.negative, above->negative, part)};
+}

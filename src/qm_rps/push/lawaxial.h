@@ -4,6 +4,7 @@
 #include "qm_rps/hinge/hingesources.h"
 #include "qm_solver/pushmodel.h"
 
+#include <span>
 #include <string>
 #include <vector>
 
@@ -36,3 +37,6 @@ struct T_AXIAL_BASIS {
 /// have both signs.
 [[nodiscard]] int StrengthsByAxial(const T_AXIAL_BASIS& basis,
                                    std::vector<solver::T_AXIAL_STRENGTH>& out, std::string& reason);
+
+/// Strengths at an axial force, tension positive; beyond the rows those of their ends.
+T_SIDES<double> StrengthAt(std::span<const solver::T_AXIAL_STRENGTH> rows, double axial);

@@ -164,10 +164,14 @@ int BackboneLaw(const CURVE& curve, T_SIDES<T_SKEL_SIDE> sides, const T_LAW_BASI
     if (curve.symmetric) MirrorSide(sides.pos, sides.neg);
     MirrorSide(T_SKEL_SIDE(sides.neg), sides.neg); // magnitudes
     const bool two = HasTwoStiffnesses(T_SKEL_CURVE(curve));
-    const T_MEASURE pos = MeasureOf(curve.initStiffness, sides.pos.userStiffness, basis);
-    const T_MEASURE neg =
-        MeasureOf(curve.initStiffness, two ? ownStiffness : sides.pos.userStiffness, basis);
     const T_BACKBONE_PAGE page{curve.measure, curve.strengthLoss};
+    T_MEASURE pos = MeasureOf(curve.initStiffness, sides.pos.userStiffness, basis);
+    T_MEASURE neg =
+        MeasureOf(curve.initStiffness, two ? ownStiffness : sides.pos.userStiffness, basis);
+    if (page.measure != SKEL_MEASURE::DDy && !pos.spring && !neg.spring) {
+        pos.compliance *= basis.atAxial.pos;
+        neg.compliance *= basis.atAxial.neg;
+    }
     const auto any = [](const T_SKEL_SIDE& s) { return s.IO != 0.0 || s.LS != 0.0 || s.CP != 0.0; };
     law.criteria = any(sides.pos) || any(sides.neg);
     if constexpr (requires { curve.compliance; }) law.criteria = law.criteria && curve.compliance;

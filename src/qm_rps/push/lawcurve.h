@@ -16,6 +16,8 @@ struct T_LAW_BASIS {
     std::optional<double> stiffness;
     double axial = 0.0;  // at the initial loads, compression positive: picks the curve by force
     double length = 1.0; // curvatures and strains times this are deformations of the hinge
+    /// Strengths at that axial force over `yield`: the member yields at so much of its rotation.
+    T_SIDES<double> atAxial{1.0, 1.0};
 };
 
 /// A law, and how its points are called.
@@ -29,7 +31,8 @@ struct T_PUSH_LAW {
 /// The law of a page. A member that is elastic up to yield (initial stiffness 6EI/L, 3EI/L, 2EI/L,
 /// elastic) has a hinge that is rigid until then: total deformation D less force over initial
 /// stiffness. A user stiffness is a spring in series with the member, its part of the deformation
-/// is in the hinge; 0 is rigid. Ratios D/Dy count in Dy = yield strength / stiffness.
+/// is in the hinge; 0 is rigid. Ratios D/Dy count in Dy = yield strength / stiffness. The elastic
+/// part of plastic deformations (D - Dy) is that at the axial force of the initial loads.
 ///
 /// Ratios of a multilinear curve run to 1000 Dy, or to the ultimate strength, where the force
 /// stays; entered deformations place the points after the first one, which is elastic. Unloading:

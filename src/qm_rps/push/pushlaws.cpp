@@ -192,14 +192,22 @@ private:
         }
         T_LAW_BASIS basis;
         basis.length = spot.length;
-        if (m_options.axial && component.type == SKEL_TYPE::Fema)
-            basis.axial = -m_options.axial(page.index, spot.at);
+        const double axial = m_options.axial ? m_options.axial(page.index, spot.at) : 0.0;
+        if (component.type == SKEL_TYPE::Fema) basis.axial = -axial;
         basis.stiffness = StiffnessOf(page, spot, curve);
-        if (!ReadStrengths(page, spot, curve, basis, reason) ||
-            !MakeLaw(curve, component.type, basis, law, reason))
+        std::vector<solver::T_AXIAL_STRENGTH> byAxial;
+        if (!ReadStrengths(page, spot, curve, basis, reason)) return 0;
+        if (IsBending(page.component) && page.element.kind == ELEM_KIND::Beam &&
+            !StrengthsOf(page, curve, basis, byAxial, reason))
             return 0;
-        if (!IsBending(page.component) || page.element.kind != ELEM_KIND::Beam) return 1;
-        return PutAxial(page, curve, basis, law, reason);
+        if (!byAxial.empty()) {
+            const T_SIDES<double> at = StrengthAt(byAxial, axial);
+            if (at.pos > 0.0 && basis.yield.pos > 0.0) basis.atAxial.pos = at.pos / basis.yield.pos;
+            if (at.neg > 0.0 && basis.yield.neg > 0.0) basis.atAxial.neg = at.neg / basis.yield.neg;
+        }
+        if (!MakeLaw(curve, component.type, basis, law, reason)) return 0;
+        PutAxial(std::move(byAxial), basis, law);
+        return 1;
     }
 
     /// Elastic stiffness in the measure of the curve. Shear: G times the shear area by the length
@@ -224,9 +232,8 @@ private:
         return *k / lookup.memberLength;
     }
 
-    /// Strength by axial force, in the engine's measure: that of the first point.
-    int PutAxial(const T_PAGE& page, const T_SKEL_CURVE& curve, const T_LAW_BASIS& basis,
-                 T_PUSH_LAW& law, std::string& reason)
+    int StrengthsOf(const T_PAGE& page, const T_SKEL_CURVE& curve, const T_LAW_BASIS& basis,
+                    std::vector<solver::T_AXIAL_STRENGTH>& out, std::string& reason)
     {
         const T_AXIAL_BASIS axial{page.type,
                                   page.component,
@@ -235,16 +242,24 @@ private:
                                   m_sources,
                                   page.element.section,
                                   page.element.material};
-        if (!StrengthsByAxial(axial, law.law.byAxial, reason)) return 0;
+        return StrengthsByAxial(axial, out, reason);
+    }
+
+    /// Strength by axial force, in the engine's measure: that of the first point.
+    static void PutAxial(std::vector<solver::T_AXIAL_STRENGTH> rows, const T_LAW_BASIS& basis,
+                         T_PUSH_LAW& law)
+    {
         const double pos = law.law.positive.points.empty()
                                ? 0.0
                                : law.law.positive.points.front().force / basis.yield.pos;
-        const double neg = law.law.negative.points.front().force / basis.yield.neg;
-        for (solver::T_AXIAL_STRENGTH& row : law.law.byAxial) {
+        const double neg = law.law.negative.points.empty()
+                               ? 0.0
+                               : law.law.negative.points.front().force / basis.yield.neg;
+        for (solver::T_AXIAL_STRENGTH& row : rows) {
             row.positive *= pos;
             row.negative *= neg;
         }
-        return 1;
+        law.law.byAxial = std::move(rows);
     }
 
     double FlexibleLength(const T_ELEM_D& e) const

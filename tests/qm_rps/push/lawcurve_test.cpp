@@ -187,6 +187,17 @@ TEST(LawCurve, AxialForcePicksTheCurveBetweenTwo)
     EXPECT_EQ(0.01, SidesAt(f, 5000).pos.C.deform);
 }
 
+TEST(LawCurve, PlasticPointsHaveTheElasticPartAtTheInitialAxialForce)
+{
+    T_LAW_BASIS basis = Basis();
+    basis.atAxial = {0.5, 1.0};
+    T_PUSH_LAW law;
+    std::string reason;
+    ASSERT_EQ(1, MakeLaw(Plastic(INIT_STIFFNESS::Elastic, 0), SKEL_TYPE::Fema, basis, law, reason));
+    // Yield at 0.005, forces half of 100, 120, 20: D = 0.05 + 0.005 - 0.5 x 20 / 1e4.
+    Expect({{0, 100}, {0.049, 120}, {0.054, 20}, {0.094, 20}}, law.law.positive, "half");
+}
+
 TEST(LawCurve, RefusesWhatNoHingeCanFollow)
 {
     T_SKEL_FEMA off = Fema(), back = Fema(), rigid = Fema(),
