@@ -334,6 +334,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_PHGT_D> r)
     v.OptKeyRef("thickness_section", r.thicknessSection, KindOf<T_SECT_D>());
     v.Part("components", r.components, r.definition);
     v.PartIf("yield_surface", r.yieldSurface);
+    v.Opt("exact_surface", r.exactSurface, false);
     v.PartIf("pmm", r.pmm);
     v.Part("length", r.length);
     v.Opt("withhold_mz_length", r.withholdMzLength, false);

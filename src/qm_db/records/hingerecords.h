@@ -223,6 +223,9 @@ struct T_PHGT_D {
     // its bars, the fibres and the thickness of a wall those of a rectangle (its smaller side).
     int fibreSection = 0, thicknessSection = 0;
     std::optional<T_YIELD_SURFACE> yieldSurface;
+    /// P-M-M: My and Mz together within the surface of section and material of the element, not
+    /// within the ellipse of their strengths.
+    bool exactSurface = false;
     std::optional<T_PMM_TABLE> pmm;
     T_HINGE_LENGTH length;
     bool withholdMzLength = false; // Mz has no hinge length although its curve asks for one

@@ -200,6 +200,14 @@ bool HasShearPair(const T_PHGT_D& type)
     return At(type, C::Fy).active && At(type, C::Fz).active;
 }
 
+bool SharesMoments(const T_PHGT_D& type)
+{
+    const auto shares = [&type](HINGE_COMPONENT c) {
+        return At(type, c).active && InteractionOf(type, c) == HINGE_INTERACTION::PMM;
+    };
+    return shares(C::My) && shares(C::Mz);
+}
+
 bool HasUserInteraction(const T_PHGT_D& type)
 {
     return Interacts<HINGE_INTERACTION::User>(type);

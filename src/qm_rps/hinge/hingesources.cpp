@@ -2,6 +2,8 @@
 
 namespace {
 
+constexpr std::size_t kSurfaceRows = 24; // axial forces of a surface
+
 template <class R>
 const R* Find(const T_TABLE<R>& table, int key)
 {
@@ -47,6 +49,21 @@ T_PM_LINES CHingeSources::Lines(int section, int material) const
                 return {};
         }
     return lines;
+}
+
+const std::vector<T_SURFACE_ROW>&
+CHingeSources::Surface(int section, int material, std::span<const double> directions) const
+{
+    T_SURFACE& kept = m_surfaces[{section, material}];
+    if (std::ranges::equal(kept.directions, directions)) return kept.rows;
+    kept = {{directions.begin(), directions.end()}, {}};
+    const T_SECT_D* s = Section(section);
+    const T_MATL_D* m = Material(material);
+    SECT_FAULT fault{};
+    if (!s || !m || !CSectionStrength::CalcSurface(*s, *m, m_units, kSurfaceRows, directions,
+                                                   kept.rows, fault))
+        kept.rows.clear();
+    return kept.rows;
 }
 
 std::optional<CAxialForceList::T_RANGE> CHingeSources::AxialRange(int section, int material) const

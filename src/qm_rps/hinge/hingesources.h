@@ -40,6 +40,11 @@ public:
     /// the strengths can't be calculated.
     T_PM_LINES Lines(int section, int material) const;
 
+    /// Rows of the surface of the same pair, see CSectionStrength::CalcSurface; kept for these
+    /// directions. Empty where it can't be calculated.
+    const std::vector<T_SURFACE_ROW>& Surface(int section, int material,
+                                              std::span<const double> directions) const;
+
     /// Axial forces that the pair can carry, compression positive: from minus the strength in
     /// tension to that in compression. Empty where they can't be calculated.
     std::optional<CAxialForceList::T_RANGE> AxialRange(int section, int material) const;
@@ -56,4 +61,9 @@ private:
     T_TABLE<T_MATL_D> m_materials;
     T_UNITS m_units;
     mutable std::map<std::pair<int, int>, T_RESULT> m_results;
+    struct T_SURFACE {
+        std::vector<double> directions;
+        std::vector<T_SURFACE_ROW> rows;
+    };
+    mutable std::map<std::pair<int, int>, T_SURFACE> m_surfaces;
 };

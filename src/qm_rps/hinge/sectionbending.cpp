@@ -105,3 +105,12 @@ int CSectionBending::Largest(T_AXIAL_MOMENT& out, double& u) const
     u = m_plastic ? 2.0 * place : place;
     return 1;
 }
+
+int CSectionBending::Towards(double direction, double axial, double& moment) const
+{
+    T_CAPACITY found;
+    T_SECTION_ERROR error;
+    if (m_straight || !m_solver.TowardsMoment(direction, axial, found, error)) return 0;
+    moment = std::hypot(found.My, found.Mz);
+    return 1;
+}

@@ -29,6 +29,9 @@ public:
     [[nodiscard]] int At(double u, T_AXIAL_MOMENT& out) const;
     [[nodiscard]] int AtAxial(double axial, T_AXIAL_MOMENT& out) const;
     [[nodiscard]] int Largest(T_AXIAL_MOMENT& out, double& u) const;
+    /// The moment that the section carries at an axial force in a direction of the moment (radians:
+    /// 0 compresses +z, pi / 2 +y). Not of a section without a shape.
+    [[nodiscard]] int Towards(double direction, double axial, double& moment) const;
 
 private:
     T_AXIAL_MOMENT Along(const solver::T_CAPACITY& capacity) const;

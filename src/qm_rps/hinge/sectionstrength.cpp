@@ -121,6 +121,30 @@ bool SolveAxis(CSectionBending& bending, bool aboutY, T_YIELD_AXIS& axis)
     return true;
 }
 
+/// One row of the surface; false where a moment can't be found or is none.
+bool SolveRow(CSectionBending& bending, std::span<const double> directions, T_SURFACE_ROW& row)
+{
+    std::array<T_SIDES<double>, 2> strength; // y, z
+    for (std::size_t k = 0; k < 2; ++k)
+        for (const bool positive : {true, false}) {
+            T_AXIAL_MOMENT found;
+            bending.Turn(k == 0, positive);
+            if (!bending.AtAxial(row.axial, found) || !Positive(found.moment)) return false;
+            (positive ? strength[k].pos : strength[k].neg) = found.moment;
+        }
+    const auto part = [](const T_SIDES<double>& s, double share) {
+        return share * (share > 0.0 ? s.pos : s.neg);
+    };
+    for (const double angle : directions) {
+        const double y = part(strength[0], std::cos(angle)), z = part(strength[1], std::sin(angle));
+        double moment = 0.0;
+        if (!bending.Towards(std::atan2(z, y), row.axial, moment) || !Positive(moment))
+            return false;
+        row.share.push_back(moment / std::hypot(y, z));
+    }
+    return true;
+}
+
 std::optional<T_SIDES<double>> Both(double v)
 {
     return Positive(v) ? std::optional(T_SIDES<double>{v, v}) : std::nullopt;
@@ -206,5 +230,32 @@ int CSectionStrength::CalcCurve(const T_SECT_D& section, const T_MATL_D& materia
     }
     fault = SECT_FAULT::None;
     out = std::move(curve);
+    return 1;
+}
+
+int CSectionStrength::CalcSurface(const T_SECT_D& section, const T_MATL_D& material,
+                                  const T_UNITS& units, std::size_t rows,
+                                  std::span<const double> directions,
+                                  std::vector<T_SURFACE_ROW>& out, SECT_FAULT& fault)
+{
+    T_SECT_D s;
+    std::optional<CSectionBending> bending;
+    if (!PrepareBending(section, material, units, s, bending, fault)) return 0;
+    if (section.shape == SECT_SHAPE::Value) {
+        fault = SECT_FAULT::Values;
+        return 0;
+    }
+    T_AXIAL_MOMENT pure, tension;
+    fault = SECT_FAULT::NotConverged;
+    if (!bending->At(2.0, pure) || !bending->At(0.0, tension)) return 0;
+    std::vector<T_SURFACE_ROW> found;
+    for (std::size_t i = 0; i < rows; ++i) {
+        const double part = (static_cast<double>(i) + 0.5) / static_cast<double>(rows);
+        T_SURFACE_ROW row{tension.axial + part * (pure.axial - tension.axial), {}};
+        if (SolveRow(*bending, directions, row)) found.push_back(std::move(row));
+    }
+    if (found.empty()) return 0;
+    fault = SECT_FAULT::None;
+    out = std::move(found);
     return 1;
 }

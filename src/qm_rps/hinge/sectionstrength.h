@@ -6,6 +6,7 @@
 
 #include <array>
 #include <optional>
+#include <span>
 #include <vector>
 
 /// What CSectionStrength finds. All values are magnitudes, in the units of the input.
@@ -15,6 +16,13 @@ struct T_SECTION_STRENGTH {
     std::array<std::optional<T_SIDES<double>>, 6> yield;
     /// Axial strengths, moments at P = 0, largest moments and the curves of the yield level.
     T_YIELD_LEVEL level;
+};
+
+/// The surface of both moments at an axial force, compression positive: how far it lies beyond the
+/// ellipse of the four strengths about the axes, by direction.
+struct T_SURFACE_ROW {
+    double axial = 0.0;
+    std::vector<double> share;
 };
 
 /// Characteristic strengths, without partial factors. Bending is uniaxial about the section's
@@ -60,4 +68,12 @@ public:
     [[nodiscard]] static int CalcCurve(const T_SECT_D& section, const T_MATL_D& material,
                                        const T_UNITS& units, bool aboutY, bool positive,
                                        std::vector<T_PM_POINT>& out, SECT_FAULT& fault);
+
+    /// The surface at so many axial forces, evenly within the axial strengths, ascending.
+    /// Directions: angles from the axis of My / strength to that of Mz / strength. 1 done; 0 with
+    /// the fault (Values: a section without a shape), `out` unchanged.
+    [[nodiscard]] static int CalcSurface(const T_SECT_D& section, const T_MATL_D& material,
+                                         const T_UNITS& units, std::size_t rows,
+                                         std::span<const double> directions,
+                                         std::vector<T_SURFACE_ROW>& out, SECT_FAULT& fault);
 };

@@ -9,6 +9,7 @@
 #include "qm_rps/hinge/pageyield.h"
 #include "qm_rps/push/lawaxial.h"
 #include "qm_rps/push/lawplaces.h"
+#include "qm_rps/push/lawsurface.h"
 
 #include <algorithm>
 #include <cmath>
@@ -149,7 +150,7 @@ private:
         std::string reason;
         if (!MakeLawOf(page, spot, law, reason)) return Fail(page, reason, spot.end);
         law.law.component = static_cast<int>(c);
-        Put(page, spot, std::move(law));
+        if (!Put(page, spot, std::move(law), reason)) return Fail(page, reason, spot.end);
         return 1;
     }
 
@@ -304,7 +305,7 @@ private:
     }
 
     /// A law to the hinge of its record that stands there.
-    void Put(const T_PAGE& page, const T_HINGE_SPOT& spot, T_PUSH_LAW law)
+    int Put(const T_PAGE& page, const T_HINGE_SPOT& spot, T_PUSH_LAW law, std::string& reason)
     {
         const auto stands = [&](const solver::T_PUSH_HINGE& h) {
             return h.element == page.index && h.at == spot.at;
@@ -328,6 +329,9 @@ private:
         if (page.component == HINGE_COMPONENT::Mz && IsBiaxial(page.type) && HasMy(*at))
             at->biaxial = true;
         m_out.laws.push_back(std::move(place));
+        if (!at->biaxial || !page.type.exactSurface) return 1;
+        return SurfaceShape(m_sources, page.element.section, page.element.material, at->laws.back(),
+                            at->shape, reason);
     }
     static bool HasMy(const solver::T_PUSH_HINGE& h)
     {

@@ -233,6 +233,11 @@ void AddParts(CFormView& form, DLG& dlg)
         return MMSGFunction::GetValue(dlg.HingeLengthCaption()) + ": " + dlg.HingeLengthsText();
     }),
         "lengths", {}, Shown(dlg, PART::HingeLength));
+    Set(form.Flag(KeyText("IDS_QM_UI_HINGE_EXACT_SURFACE"),
+                  {[&dlg] { return dlg.Type().exactSurface; },
+                   [&dlg](const bool& on) { dlg.Edited().exactSurface = on; }}),
+        "exactSurface", [&dlg] { return dlg.Type().exactSurface || SharesMoments(dlg.Type()); },
+        Shown(dlg, PART::YieldSurface));
     Set(form.Flag(KeyText("IDS_QM_UI_HINGE_WITHHOLD"),
                   {[&dlg] { return dlg.Type().withholdMzLength; },
                    [&dlg](const bool& on) { dlg.Edited().withholdMzLength = on; }}),
