@@ -2,7 +2,7 @@
 
 #include "qm_rps/codes/concretelaw.h"
 #include "qm_rps/hinge/sectionbending.h"
-#include "qm_rps/push/lawaxial.h"
+#include "qm_rps/push/law/lawaxial.h"
 
 #include <algorithm>
 #include <cmath>

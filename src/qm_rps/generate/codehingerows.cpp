@@ -2,7 +2,7 @@
 
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
-#include "qm_rps/push/lawaxial.h"
+#include "qm_rps/push/law/lawaxial.h"
 
 #include <algorithm>
 #include <cmath>

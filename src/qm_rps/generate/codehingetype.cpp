@@ -5,7 +5,7 @@
 #include "qm_rps/generate/masonryhinge.h"
 #include "qm_rps/generate/rchinge.h"
 #include "qm_rps/generate/steelhinge.h"
-#include "qm_rps/push/lawaxial.h"
+#include "qm_rps/push/law/lawaxial.h"
 
 #include <algorithm>
 #include <cmath>

@@ -202,8 +202,15 @@ bool HasShearPair(const T_PHGT_D& type)
 
 bool SharesMoments(const T_PHGT_D& type)
 {
+    return ShareSurface(type) && InteractionOf(type, C::My) == HINGE_INTERACTION::PMM &&
+           InteractionOf(type, C::Mz) == HINGE_INTERACTION::PMM;
+}
+
+bool ShareSurface(const T_PHGT_D& type)
+{
     const auto shares = [&type](HINGE_COMPONENT c) {
-        return At(type, c).active && InteractionOf(type, c) == HINGE_INTERACTION::PMM;
+        const HINGE_INTERACTION i = InteractionOf(type, c);
+        return At(type, c).active && (i == HINGE_INTERACTION::MyMz || i == HINGE_INTERACTION::PMM);
     };
     return shares(C::My) && shares(C::Mz);
 }

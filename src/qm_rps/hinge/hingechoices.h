@@ -39,7 +39,9 @@ HINGE_INTERACTION InteractionOf(const T_PHGT_D& type, HINGE_COMPONENT c);
 /// How many of them a component offers: Vy-Vz too where it has it already.
 std::size_t OfferedInteractions(const T_PHGT_D& type, HINGE_COMPONENT c);
 bool HasShearPair(const T_PHGT_D& type);
-/// My and Mz are active with P-M-M interaction: they share a surface that follows the axial force.
+/// My and Mz are active and share one surface.
+bool ShareSurface(const T_PHGT_D& type);
+/// They do with P-M-M interaction: the surface follows the axial force.
 bool SharesMoments(const T_PHGT_D& type);
 /// My or Mz is active and has the P-M curves of the user.
 bool HasUserInteraction(const T_PHGT_D& type);

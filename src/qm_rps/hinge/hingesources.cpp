@@ -51,8 +51,8 @@ T_PM_LINES CHingeSources::Lines(int section, int material) const
     return lines;
 }
 
-const std::vector<T_SURFACE_ROW>&
-CHingeSources::Surface(int section, int material, std::span<const double> directions) const
+const std::vector<T_SURFACE_ROW>& CHingeSources::Surface(int section, int material,
+                                                         std::span<const double> directions) const
 {
     T_SURFACE& kept = m_surfaces[{section, material}];
     if (std::ranges::equal(kept.directions, directions)) return kept.rows;
@@ -60,8 +60,8 @@ CHingeSources::Surface(int section, int material, std::span<const double> direct
     const T_SECT_D* s = Section(section);
     const T_MATL_D* m = Material(material);
     SECT_FAULT fault{};
-    if (!s || !m || !CSectionStrength::CalcSurface(*s, *m, m_units, kSurfaceRows, directions,
-                                                   kept.rows, fault))
+    if (!s || !m ||
+        !CSectionStrength::CalcSurface(*s, *m, m_units, kSurfaceRows, directions, kept.rows, fault))
         kept.rows.clear();
     return kept.rows;
 }

@@ -4,7 +4,7 @@
 #include "qm_rps/codes/en1998backbone.h"
 #include "qm_rps/codes/en1998shear.h"
 #include "qm_rps/generate/rchinge.h"
-#include "qm_rps/push/lawaxial.h"
+#include "qm_rps/push/law/lawaxial.h"
 
 #include <algorithm>
 #include <cmath>

@@ -7,9 +7,9 @@
 #include "qm_rps/hinge/hingetable.h"
 #include "qm_rps/hinge/hingetypefindings.h"
 #include "qm_rps/hinge/pageyield.h"
-#include "qm_rps/push/lawaxial.h"
-#include "qm_rps/push/lawplaces.h"
-#include "qm_rps/push/lawsurface.h"
+#include "qm_rps/push/law/lawaxial.h"
+#include "qm_rps/push/law/lawplaces.h"
+#include "qm_rps/push/law/lawsurface.h"
 
 #include <algorithm>
 #include <cmath>
@@ -293,17 +293,6 @@ private:
         }
     }
 
-    /// My and Mz share one surface.
-    static bool IsBiaxial(const T_PHGT_D& type)
-    {
-        const auto shares = [&](HINGE_COMPONENT c) {
-            const HINGE_INTERACTION i = InteractionOf(type, c);
-            return At(type, c).active &&
-                   (i == HINGE_INTERACTION::MyMz || i == HINGE_INTERACTION::PMM);
-        };
-        return shares(HINGE_COMPONENT::My) && shares(HINGE_COMPONENT::Mz);
-    }
-
     /// A law to the hinge of its record that stands there.
     int Put(const T_PAGE& page, const T_HINGE_SPOT& spot, T_PUSH_LAW law, std::string& reason)
     {
@@ -326,7 +315,7 @@ private:
             at->laws.size(),    page.component, std::move(law.letters),
             law.criteria,       law.fails};
         at->laws.push_back(std::move(law.law));
-        if (page.component == HINGE_COMPONENT::Mz && IsBiaxial(page.type) && HasMy(*at))
+        if (page.component == HINGE_COMPONENT::Mz && ShareSurface(page.type) && HasMy(*at))
             at->biaxial = true;
         m_out.laws.push_back(std::move(place));
         if (!at->biaxial || !page.type.exactSurface) return 1;

@@ -2,7 +2,7 @@
 #pragma once
 
 #include "qm_db/dbdoc.h"
-#include "qm_rps/push/lawcurve.h"
+#include "qm_rps/push/law/lawcurve.h"
 
 #include <functional>
 #include <span>

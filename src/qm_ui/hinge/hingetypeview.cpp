@@ -233,7 +233,8 @@ void AddParts(CFormView& form, DLG& dlg)
         return MMSGFunction::GetValue(dlg.HingeLengthCaption()) + ": " + dlg.HingeLengthsText();
     }),
         "lengths", {}, Shown(dlg, PART::HingeLength));
-    Set(form.Flag(KeyText("IDS_QM_UI_HINGE_EXACT_SURFACE"),
+    Set(
+        form.Flag(KeyText("IDS_QM_UI_HINGE_EXACT_SURFACE"),
                   {[&dlg] { return dlg.Type().exactSurface; },
                    [&dlg](const bool& on) { dlg.Edited().exactSurface = on; }}),
         "exactSurface", [&dlg] { return dlg.Type().exactSurface || SharesMoments(dlg.Type()); },

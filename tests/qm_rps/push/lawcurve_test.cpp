@@ -1,7 +1,7 @@
 // Skeleton curves as laws of the engine. Expected points are worked by hand: total deformation less
 // force over initial stiffness.
-#include "qm_rps/push/lawcurve.h"
-#include "qm_rps/push/lawplaces.h"
+#include "qm_rps/push/law/lawcurve.h"
+#include "qm_rps/push/law/lawplaces.h"
 #include "qm_rps/push/pushstates.h"
 
 #include <gtest/gtest.h>

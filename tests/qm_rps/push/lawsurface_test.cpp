@@ -1,6 +1,6 @@
-// The surface of a section in the measure of the engine. Shares by tests/oracle/section.py (strips):
-// moments towards a direction over the ellipse of the moments about the axes.
-#include "qm_rps/push/lawsurface.h"
+// The surface of a section in the measure of the engine. Shares by tests/oracle/section.py
+// (strips): moments towards a direction over the ellipse of the moments about the axes.
+#include "qm_rps/push/law/lawsurface.h"
 
 #include <gtest/gtest.h>
 
@@ -30,7 +30,8 @@ CHingeSources Sources(double aside = 0.0)
     square.area = 0.01, square.Zy = square.Zz = 4e-4, square.Iyy = square.Izz = 2e-5;
     T_MATL_D steel;
     steel.E = 2e11, steel.Fy = 250e6;
-    return {{{1, section}, {2, square}}, {{1, concrete}, {2, steel}}, {FORCE_UNIT::N, LENGTH_UNIT::m}};
+    return {
+        {{1, section}, {2, square}}, {{1, concrete}, {2, steel}}, {FORCE_UNIT::N, LENGTH_UNIT::m}};
 }
 
 solver::T_HINGE_LAW Law()

@@ -1,4 +1,4 @@
-#include "qm_rps/push/lawsurface.h"
+#include "qm_rps/push/law/lawsurface.h"
 
 #include "qm_base/say.h"
 
@@ -39,9 +39,9 @@ void MakeConvex(T_SHARES& share)
         for (std::size_t k = 0; k < share.size(); ++k) {
             const std::size_t a = (k + share.size() - 1) % share.size();
             const std::size_t b = (k + 1) % share.size();
-            const double line = std::sin(corners[b] - corners[a]) /
-                                (std::sin(corners[b] - corners[k]) / share[a] +
-                                 std::sin(corners[k] - corners[a]) / share[b]);
+            const double line =
+                std::sin(corners[b] - corners[a]) / (std::sin(corners[b] - corners[k]) / share[a] +
+                                                     std::sin(corners[k] - corners[a]) / share[b]);
             if (share[k] >= line * (1.0 - kSettled)) continue;
             share[k] = line;
             moved = true;

@@ -1,4 +1,4 @@
-#include "qm_rps/push/lawaxial.h"
+#include "qm_rps/push/law/lawaxial.h"
 
 #include "qm_base/say.h"
 #include "qm_rps/hinge/hingechoices.h"

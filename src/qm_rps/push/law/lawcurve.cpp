@@ -1,4 +1,4 @@
-#include "qm_rps/push/lawcurve.h"
+#include "qm_rps/push/law/lawcurve.h"
 
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"

@@ -1,4 +1,4 @@
-#include "qm_rps/push/lawplaces.h"
+#include "qm_rps/push/law/lawplaces.h"
 
 #include "qm_base/say.h"
 #include "qm_rps/hinge/hingefindings.h"
