@@ -68,8 +68,7 @@ public:
         path.baseReaction.push_back(step.run.baseReaction[step.step]);
         std::vector<T_END_STATE>& states = path.ends.emplace_back();
         for (const T_JUDGED_END& end : ends)
-            states.push_back(end.axes.length > 0.0 ? EndState(end.place, end.axes, end.hinge, step)
-                                                   : T_END_STATE{});
+            states.push_back(StateOf(end, step));
     }
 
     std::vector<T_JUDGED_END> ends;
@@ -140,7 +139,7 @@ T_JUDGED_LIMIT LimitOf(const T_FIRST_PASS& first, const T_JUDGED_STATE& state,
     limit.demand = std::fabs(state.point.displacement - start);
     limit.demandPga = scaled.Pga(state.point.state);
     if (!first.end) {
-        const bool none = !path.ends.empty() && first.unchecked == path.ends.front().size();
+        const bool none = first.unchecked == first.all;
         limit.why = Say(none ? "IDS_QM_JUDGE_NO_END" : "IDS_QM_JUDGE_NOT_PASSED");
         return limit;
     }
@@ -205,7 +204,7 @@ T_JUDGEMENT JudgeEvaluation(CDBDoc& doc, const T_PUSH_EVALUATION& result,
     for (T_JUDGED_STATE& state : out.states)
         if (state.found == AT_POINT::Reached)
             if (const auto index = IndexAt(path, state.point.displacement))
-                JudgeState(out.ends, path, *index, options.factors, state);
+                JudgeState(out.ends, path, *index, options, state);
     FindLimits(doc, result, path, run.startDisplacement, out);
     return out;
 }

@@ -83,7 +83,8 @@ T_TEXT_TABLE CPushOverJudgementDlg::Table() const
          {JUDGED_COLUMN::Element, JUDGED_COLUMN::N, JUDGED_COLUMN::M, JUDGED_COLUMN::V,
           JUDGED_COLUMN::Span, JUDGED_COLUMN::ThetaY, JUDGED_COLUMN::Theta,
           JUDGED_COLUMN::ThetaCapacity, JUDGED_COLUMN::ThetaRatio, JUDGED_COLUMN::Shear,
-          JUDGED_COLUMN::ShearCapacity, JUDGED_COLUMN::ShearRatio})
+          JUDGED_COLUMN::ShearCapacity, JUDGED_COLUMN::ShearRatio, JUDGED_COLUMN::Other,
+          JUDGED_COLUMN::OtherCapacity, JUDGED_COLUMN::OtherRatio})
         table.columns[static_cast<std::size_t>(number)].number = true;
     const T_JUDGED_STATE* const state = State();
     for (std::size_t i = 0; state && i < state->rows.size(); ++i) {

@@ -1,5 +1,6 @@
 #include "json/judgementjson.h"
 
+#include "qm_rps/generate/codehingerows.h"
 #include "qm_rps/judge/judgementtable.h"
 #include "qm_rps/push/pushatpointtext.h"
 #include "json/tracejson.h"
@@ -15,7 +16,7 @@ public:
         w.Object();
         w.Member("evaluation", m_j.evaluation).Member("push", m_j.push);
         w.Key("units").Object(kJsonOneLine);
-        w.Member("force", NameOf(m_j.units.force)).Member("length", NameOf(m_j.units.length));
+        w.Member("force", ::NameOf(m_j.units.force)).Member("length", ::NameOf(m_j.units.length));
         w.Member("rotation", "rad").End();
         if (m_j.note.empty())
             w.Member("verdict", kVerdictNames[static_cast<std::size_t>(m_j.Verdict())]);
@@ -43,45 +44,72 @@ private:
         return si ? std::optional(FromSi(*si, m_j.units, dim) + 0.0) : si;
     }
 
+    static const char* NameOf(JUDGE_MODE mode)
+    {
+        return kModeNames[static_cast<std::size_t>(mode)];
+    }
+
     void WriteCount(CJsonText& w, const T_VERDICT_COUNT& count) const
     {
         for (std::size_t v = 0; v < count.count.size(); ++v)
             w.Member(kVerdictNames[v], count.count[v]);
     }
 
-    void WriteCheck(CJsonText& w, const T_JUDGED_END& end, const T_JUDGED_ROW& row, JUDGE_MODE mode,
+    void WriteCheck(CJsonText& w, const T_JUDGED_END& end, const T_MODE_CHECK& mode,
                     std::size_t level) const
     {
-        const bool rotation = mode == JUDGE_MODE::Rotation;
-        const std::optional<T_CHECK>& check = row.checks.Of(mode, level);
-        w.Key(kModeNames[static_cast<std::size_t>(mode)]).Object(kJsonOneLine);
+        const std::optional<T_CHECK>& check = mode.at[level];
+        w.Key(NameOf(mode.mode)).Object(kJsonOneLine);
         if (check) {
-            const T_DIM dim = rotation ? kDimNone : kDimForce;
-            w.Member("demand", Shown(check->demand, dim));
-            w.Member("capacity", Shown(check->capacity, dim));
+            w.Member("demand", Shown(check->demand, mode.dim));
+            w.Member("capacity", Shown(check->capacity, mode.dim));
+            if (mode.mode == JUDGE_MODE::Joint) w.Member("unit", UnitText(mode.dim, m_j.units));
             w.Member("ratio", check->Ratio());
             w.Member("verdict", kVerdictNames[check->Holds() ? 0 : 1]);
             if (end.basis == JUDGE_BASIS::Code) {
-                const auto& trace = rotation ? row.checks.rotationTrace : row.checks.shearTrace;
-                w.Member("clause", ClauseOf(end, row, mode, level));
-                w.Member("least_sure_figure",
-                         kMarkWords[static_cast<std::size_t>(LeastSureOf(trace))]);
+                w.Member("clause", mode.clause[level]);
+                w.Member("least_sure_figure", kMarkWords[static_cast<std::size_t>(mode.leastSure)]);
             }
         } else {
-            w.Member("verdict", kVerdictNames[2]);
-            w.Member("reason", rotation ? row.checks.whyNoRotation : row.checks.whyNoShear);
+            w.Member("verdict", kVerdictNames[2]).Member("reason", mode.why);
         }
         w.End();
+    }
+
+    /// Which end of which element, or which joint.
+    void WritePlace(CJsonText& w, const T_JUDGED_END& end) const
+    {
+        if (end.joint) {
+            w.Member("node", end.joint->node);
+            w.Beside().Member("axis", kAxisNames[end.joint->along]);
+            return;
+        }
+        const T_END_PLACE& place = end.place;
+        w.Member("element", place.element);
+        const char* const at = end.kind == JUDGED_KIND::Brace ? "C" : place.atJ ? "J" : "I";
+        w.Beside().Member("end", at);
+        w.Beside().Member("component", kComponentNames[static_cast<std::size_t>(place.component)]);
+    }
+
+    /// What the end does: of joints forces alone.
+    void WriteMotion(CJsonText& w, const T_JUDGED_END& end, const T_JUDGED_ROW& row) const
+    {
+        if (end.joint) return;
+        const bool brace = end.kind == JUDGED_KIND::Brace;
+        const T_DIM dim = brace ? kDimLength : kDimNone;
+        const auto known = [](double v) { return v > 0.0 ? std::optional(v) : std::nullopt; };
+        w.Member("LV", Shown(known(row.checks.LV), kDimLength)).Beside();
+        w.Member("theta_y", known(row.checks.thetaY)).Beside();
+        w.Member(brace ? "elongation" : "chord_rotation", Shown(row.state.chord, dim)).Beside();
+        w.Member("hinge_deformation", Shown(row.state.flowed, dim)).Beside();
+        w.Member("ductility", known(row.checks.ductility));
     }
 
     void Write(CJsonText& w, const T_JUDGED_STATE& state, const T_JUDGED_ROW& row) const
     {
         const T_JUDGED_END& end = m_j.ends[row.end];
         w.Object();
-        w.Member("element", end.place.element);
-        w.Beside().Member("end", end.place.atJ ? "J" : "I");
-        w.Beside().Member("component",
-                          kComponentNames[static_cast<std::size_t>(end.place.component)]);
+        WritePlace(w, end);
         w.Beside().Member("storey", end.storey);
         w.Beside().Member("by", end.basis == JUDGE_BASIS::Nothing ? std::nullopt
                                                                   : std::optional(end.Code()));
@@ -89,25 +117,20 @@ private:
         w.Member("N", Shown(row.state.N, kDimForce)).Beside();
         w.Member("M", Shown(row.state.M, kDimMoment)).Beside();
         w.Member("V", Shown(row.state.V, kDimForce)).Beside();
-        const auto known = [](double v) { return v > 0.0 ? std::optional(v) : std::nullopt; };
-        w.Member("LV", Shown(known(row.checks.LV), kDimLength)).Beside();
-        w.Member("theta_y", known(row.checks.thetaY)).Beside();
-        w.Member("chord_rotation", row.state.chord).Beside();
-        w.Member("hinge_deformation", row.state.flowed).Beside();
-        w.Member("ductility", known(row.checks.ductility));
-        WriteCheck(w, end, row, JUDGE_MODE::Rotation, state.level);
-        WriteCheck(w, end, row, JUDGE_MODE::Shear, state.level);
-        w.Member("ratio", row.ratio);
-        const bool any = row.checks.rotation[state.level] || row.checks.shear[state.level];
-        w.Beside().Member(
-            "governing",
-            any ? std::optional<std::string>(kModeNames[static_cast<std::size_t>(row.governing)])
-                : std::nullopt);
-        w.Beside().Member("verdict", kVerdictNames[static_cast<std::size_t>(row.verdict)]);
-        if (m_trace) {
-            WriteTrace(w, "rotation_trace", row.checks.rotationTrace, m_j.units);
-            WriteTrace(w, "shear_trace", row.checks.shearTrace, m_j.units);
+        WriteMotion(w, end, row);
+        bool any = false;
+        for (const T_MODE_CHECK& mode : row.checks.modes) {
+            WriteCheck(w, end, mode, state.level);
+            any = any || mode.at[state.level];
         }
+        w.Member("ratio", row.ratio);
+        w.Beside().Member("governing",
+                          any ? std::optional<std::string>(NameOf(row.governing)) : std::nullopt);
+        w.Beside().Member("verdict", kVerdictNames[static_cast<std::size_t>(row.verdict)]);
+        for (const T_MODE_CHECK& mode : row.checks.modes)
+            if (m_trace)
+                WriteTrace(w, (std::string(NameOf(mode.mode)) + "_trace").c_str(), mode.trace,
+                           m_j.units);
         w.End();
     }
 
@@ -154,11 +177,9 @@ private:
         const T_FIRST_PASS& first = limit.first;
         w.Object(kJsonOneLine);
         w.Member("name", limit.state);
-        w.Member("mode", kModeNames[static_cast<std::size_t>(first.mode)]);
+        w.Member("mode", NameOf(first.mode));
         if (first.end) {
-            const T_END_PLACE& place = m_j.ends[*first.end].place;
-            w.Member("element", place.element).Member("end", place.atJ ? "J" : "I");
-            w.Member("component", kComponentNames[static_cast<std::size_t>(place.component)]);
+            WritePlace(w, m_j.ends[*first.end]);
             w.Member("displacement", Shown(first.displacement, kDimLength));
             w.Member("base_reaction", Shown(first.baseReaction, kDimForce));
         }

@@ -35,6 +35,7 @@ T_JUDGE_OPTIONS OptionsOf(const T_JUDGE_COMMAND& o)
         for (std::size_t i = 0; i < kLevels; ++i)
             if (o.level == names[i]) options.level = i;
     options.factors = o.factors;
+    options.trace = o.trace;
     return options;
 }
 

@@ -37,17 +37,22 @@ std::optional<T_VECTOR> WayFrom(const T_MODEL& model, const T_ELEM_D& e, int nod
     return way;
 }
 
-/// Members of concrete that meet at a node.
+/// Members that meet at a node.
 struct T_MEETING {
     int above = 0, below = 0;
     std::vector<int> ahead, behind, across;
+
+    bool IsJoint() const
+    {
+        return (above != 0 || below != 0) && !(ahead.empty() && behind.empty());
+    }
 };
-T_MEETING MeetingAt(const T_MODEL& model, int node, std::size_t along)
+T_MEETING MeetingAt(const T_MODEL& model, std::span<const int> beams, int node, std::size_t along)
 {
     T_MEETING m;
     const std::size_t up = VerticalAxis(model);
-    for (const auto& [id, e] : model.elements) {
-        if (e.kind != ELEM_KIND::Beam || (e.nodeI != node && e.nodeJ != node)) continue;
+    for (const int id : beams) {
+        const T_ELEM_D& e = model.elements.at(id);
         const auto way = WayFrom(model, e, node);
         if (!way) continue;
         if ((*way)[up] > kAlong)
@@ -153,10 +158,34 @@ bool Circolare(const T_JOINT& j, const T_JOINT_DEMAND& d, T_JOINT_CHECK& out, CC
 
 } // namespace
 
-int ReadJoint(const T_MODEL& model, int node, std::size_t along, HINGE_CODE code, T_JOINT& out,
-              std::string& reason)
+T_NODE_BEAMS BeamsByNode(const T_MODEL& model)
 {
-    const T_MEETING m = MeetingAt(model, node, along);
+    T_NODE_BEAMS out;
+    for (const auto& [id, e] : model.elements) {
+        if (e.kind != ELEM_KIND::Beam) continue;
+        out[e.nodeI].push_back(id);
+        if (e.nodeJ != e.nodeI) out[e.nodeJ].push_back(id);
+    }
+    return out;
+}
+
+T_JOINT_MEMBERS MembersOfJoint(const T_MODEL& model, std::span<const int> beams, int node,
+                               std::size_t along)
+{
+    const T_MEETING m = MeetingAt(model, beams, node, along);
+    T_JOINT_MEMBERS out;
+    if (!m.IsJoint()) return out;
+    out.above = m.above;
+    out.column = m.below != 0 ? m.below : m.above;
+    out.beams = m.ahead;
+    out.beams.insert(out.beams.end(), m.behind.begin(), m.behind.end());
+    return out;
+}
+
+int ReadJoint(const T_MODEL& model, std::span<const int> around, int node, std::size_t along,
+              HINGE_CODE code, T_JOINT& out, std::string& reason)
+{
+    const T_MEETING m = MeetingAt(model, around, node, along);
     const int column = m.below != 0 ? m.below : m.above;
     std::vector<int> beams = m.ahead;
     beams.insert(beams.end(), m.behind.begin(), m.behind.end());
@@ -208,10 +237,8 @@ int CheckJoint(const T_JOINT& joint, const T_JOINT_DEMAND& demand, T_JOINT_CHECK
     sheet.Put("z", joint.lever, kDimLength, "", "0.9 d of the beams", K);
     sheet.Put("bj hc", joint.width * joint.hc, T_DIM{0, 2}, "", "", K);
     sheet.Put("N", demand.axial, kDimForce, "", "of the column above", K);
-    check.shear =
-        sheet.Put("Vj", std::fabs(demand.beamMoments) / joint.lever - std::fabs(demand.columnShear),
-                  kDimForce, "", "sum M/z - V of the column", K);
-    check.shear = std::max(0.0, check.shear);
+    check.shear = sheet.Put("Vj", std::fabs(demand.beamMoments / joint.lever - demand.columnShear),
+                            kDimForce, "", "sum M/z - V of the column", K);
     check.demand = check.shear;
     check.dim = kDimForce;
     bool done = true;
@@ -226,6 +253,8 @@ int CheckJoint(const T_JOINT& joint, const T_JOINT_DEMAND& demand, T_JOINT_CHECK
     }
     if (!done || !sheet.Sound()) return Fail(reason, ReasonOf(sheet));
     sheet.Warn("IDS_QM_GEN_WARN_JOINT_HOOPS", {});
+    if (IsChordCode(joint.code) && joint.kind == JOINT_KIND::InteriorWithBeams)
+        sheet.Warn("IDS_QM_GEN_WARN_JOINT_CONFINED", {});
     check.trace = joint.trace;
     check.trace.insert(check.trace.end(), sheet.Trace().begin(), sheet.Trace().end());
     check.warnings = sheet.Warnings();

@@ -5,6 +5,8 @@
 #include "qm_rps/codes/asce41concrete.h"
 #include "qm_rps/generate/codeside.h"
 
+#include <span>
+
 /// A joint in the plane of the vertical and a horizontal axis.
 struct T_JOINT {
     HINGE_CODE code = HINGE_CODE::Asce17;
@@ -18,18 +20,34 @@ struct T_JOINT {
     double lower = 0.0;           // lower bound (ASCE 41)
     std::vector<T_CODE_TRACE> trace; // of the strengths
 };
+/// Beam elements by the nodes of their ends.
+using T_NODE_BEAMS = std::map<int, std::vector<int>>;
+T_NODE_BEAMS BeamsByNode(const T_MODEL& model);
+
+/// What meets at a node in the plane of the vertical and the axis `along`, within 45 degrees.
+struct T_JOINT_MEMBERS {
+    int above = 0;          // column; 0: none
+    int column = 0;         // below, else above; 0: no column with a beam, so no joint
+    std::vector<int> beams; // in the plane
+};
+/// `around`: the beam elements of the node.
+T_JOINT_MEMBERS MembersOfJoint(const T_MODEL& model, std::span<const int> around, int node,
+                               std::size_t along);
+
 /// The joint at a node along a global horizontal axis (0: X, 1: Y, 2: Z). Rectangular columns and
-/// beams of concrete with bars. 1 done; 0 with the reason in words, `out` unchanged.
-[[nodiscard]] int ReadJoint(const T_MODEL& model, int node, std::size_t along, HINGE_CODE code,
-                            T_JOINT& out, std::string& reason);
+/// beams of concrete with bars. `around`: the beam elements of the node. 1 done; 0 with the reason
+/// in words, `out` unchanged.
+[[nodiscard]] int ReadJoint(const T_MODEL& model, std::span<const int> around, int node,
+                            std::size_t along, HINGE_CODE code, T_JOINT& out, std::string& reason);
 
 struct T_JOINT_DEMAND {
     double beamMoments = 0.0; // sum of the beams' end moments that turn the joint the same way
-    double columnShear = 0.0; // of the column above, against the force of the bars
-    double axial = 0.0;       // of the column above, compression positive
+    double columnShear =
+        0.0;            // of the column above, against the force of the bars: one sign with them
+    double axial = 0.0; // of the column above, compression positive
 };
 struct T_JOINT_CHECK {
-    double shear = 0.0;                        // Vj = beam moments / lever - column shear
+    double shear = 0.0;                        // Vj = |beam moments / lever - column shear|
     double demand = 0.0, capacity = 0.0;       // forces; Circolare: the governing stress, its limit
     T_DIM dim{};                               // of these
     std::optional<T_CODE_PLASTIC> rotations{}; // ASCE 41 Table 10-11: shear angles

@@ -1,27 +1,11 @@
 #include "qm_rps/judge/endstate.h"
 
+#include "qm_rps/judge/vectors.h"
+
 #include <algorithm>
 #include <cmath>
-#include <numeric>
 
 namespace {
-
-using T_VECTOR = std::array<double, 3>;
-
-double Dot(const T_VECTOR& a, const T_VECTOR& b)
-{
-    return std::inner_product(a.begin(), a.end(), b.begin(), 0.0);
-}
-
-T_VECTOR Cross(const T_VECTOR& a, const T_VECTOR& b)
-{
-    return {a[1] * b[2] - a[2] * b[1], a[2] * b[0] - a[0] * b[2], a[0] * b[1] - a[1] * b[0]};
-}
-
-T_VECTOR Plus(const T_VECTOR& a, const T_VECTOR& b, double factor)
-{
-    return {a[0] + factor * b[0], a[1] + factor * b[1], a[2] + factor * b[2]};
-}
 
 /// Length; the vector becomes a unit vector. 0: it is none.
 double Normalise(T_VECTOR& v)
@@ -47,11 +31,17 @@ T_VECTOR EndMove(const T_DOF6& node, const T_VECTOR& offset)
     return Plus({node[0], node[1], node[2]}, Cross({node[3], node[4], node[5]}, offset), 1.0);
 }
 
+/// Of the J-end of the flexible part from the I-end.
+T_VECTOR MovedApart(const T_MEMBER_AXES& axes, const T_DOF6& i, const T_DOF6& j)
+{
+    return Plus(EndMove(j, axes.offsetJ), EndMove(i, axes.offsetI), -1.0);
+}
+
 double ChordRotation(const T_END_PLACE& place, const T_MEMBER_AXES& axes, const T_RUN_DATA& data,
                      std::size_t step)
 {
     const T_DOF6 i = MoveOf(data, step, axes.nodeI), j = MoveOf(data, step, axes.nodeJ);
-    const T_VECTOR moved = Plus(EndMove(j, axes.offsetJ), EndMove(i, axes.offsetI), -1.0);
+    const T_VECTOR moved = MovedApart(axes, i, j);
     const T_DOF6& own = place.atJ ? j : i;
     const T_VECTOR turn{own[3], own[4], own[5]};
     // A right-hand turn about y moves +x towards -z, one about z towards +y.
@@ -88,24 +78,36 @@ T_END_STATE Between(const T_END_STATE& a, const T_END_STATE& b, double at)
 {
     T_END_STATE s;
     for (double T_END_STATE::*m :
-         {&T_END_STATE::N, &T_END_STATE::M, &T_END_STATE::V, &T_END_STATE::chord,
-          &T_END_STATE::flowed, &T_END_STATE::hingeMoment})
+         {&T_END_STATE::N, &T_END_STATE::M, &T_END_STATE::V, &T_END_STATE::across,
+          &T_END_STATE::chord, &T_END_STATE::flowed, &T_END_STATE::hingeMoment})
         s.*m = a.*m + at * (b.*m - a.*m);
     return s;
+}
+
+const solver::T_VEC6& ForcesAt(int element, bool atJ, const T_STEP_FORCES& step)
+{
+    const auto at = std::ranges::lower_bound(step.elements, element);
+    const auto& forces = step.result.force[static_cast<std::size_t>(at - step.elements.begin())];
+    return atJ ? forces.back() : forces.front();
 }
 
 T_END_STATE EndState(const T_END_PLACE& place, const T_MEMBER_AXES& axes, long hinge,
                      const T_STEP_FORCES& step)
 {
     T_END_STATE s;
-    const auto at = std::ranges::lower_bound(step.elements, place.element);
-    const auto& forces = step.result.force[static_cast<std::size_t>(at - step.elements.begin())];
-    const solver::T_VEC6& end = place.atJ ? forces.back() : forces.front();
-    const bool aboutY = place.component == HINGE_COMPONENT::My;
+    const solver::T_VEC6& end = ForcesAt(place.element, place.atJ, step);
     s.N = -end[0];
-    s.M = end[aboutY ? 4 : 5];
-    s.V = end[aboutY ? 2 : 1];
-    s.chord = ChordRotation(place, axes, step.run.data, step.step);
+    if (place.component == HINGE_COMPONENT::Fx) {
+        s.chord = Dot(MovedApart(axes, MoveOf(step.run.data, step.step, axes.nodeI),
+                                 MoveOf(step.run.data, step.step, axes.nodeJ)),
+                      axes.x);
+    } else {
+        const bool aboutY = place.component == HINGE_COMPONENT::My;
+        s.M = end[aboutY ? 4 : 5];
+        s.across = end[aboutY ? 5 : 4];
+        s.V = end[aboutY ? 2 : 1];
+        s.chord = ChordRotation(place, axes, step.run.data, step.step);
+    }
     if (hinge < 0) return s;
     const T_PUSH_HINGE_SERIES& series = step.run.hinges[static_cast<std::size_t>(hinge)];
     s.flowed = series.deformation[step.step];

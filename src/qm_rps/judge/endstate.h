@@ -13,11 +13,11 @@ struct T_MEMBER_AXES {
 /// Nothing where the offsets leave no length.
 std::optional<T_MEMBER_AXES> AxesOf(const T_MODEL& model, const T_ELEM_D& element);
 
-/// Which end of which element, bent about which of its axes.
+/// Which end of which element, bent about which of its axes; of a brace Fx, which is of both ends.
 struct T_END_PLACE {
     int element = 0;
     bool atJ = false;
-    HINGE_COMPONENT component = HINGE_COMPONENT::My; // or Mz
+    HINGE_COMPONENT component = HINGE_COMPONENT::My; // Mz, Fx
     bool operator==(const T_END_PLACE&) const = default;
 };
 
@@ -25,12 +25,17 @@ struct T_END_PLACE {
 struct T_END_STATE {
     double N = 0.0; // compression positive
     double M = 0.0, V = 0.0;
-    double chord = 0.0;  // rotation of the end, that of its hinge included, less that of the chord
+    double across = 0.0; // moment about the other axis
+    double chord = 0.0;  // rotation of the end, that of its hinge included, less that of the chord;
+                         // of a brace its elongation
     double flowed = 0.0; // deformation of the hinge at the end, 0 without one
-    double hingeMoment = 0.0;
+    double hingeMoment = 0.0; // of a brace: force
 };
 /// On the straight line from a (0) to b (1); beyond them too.
 T_END_STATE Between(const T_END_STATE& a, const T_END_STATE& b, double at);
+
+/// Axial force, shears, torsion and moments of an end in a step, with the signs of an analysis.
+const solver::T_VEC6& ForcesAt(int element, bool atJ, const T_STEP_FORCES& step);
 
 /// The state of an end in a step. `hinge`: its component among those of the run; -1: none.
 T_END_STATE EndState(const T_END_PLACE& place, const T_MEMBER_AXES& axes, long hinge,

@@ -1,9 +1,11 @@
 #include "qm_rps/judge/judgedend.h"
 
 #include "qm_base/say.h"
-#include "qm_rps/codes/en1998backbone.h"
-#include "qm_rps/codes/en1998shear.h"
+#include "qm_rps/codes/asce41strength.h"
+#include "qm_rps/generate/masonryhinge.h"
 #include "qm_rps/generate/rchinge.h"
+#include "qm_rps/generate/steelhinge.h"
+#include "qm_rps/judge/judgedchecks.h"
 #include "qm_rps/push/law/lawaxial.h"
 
 #include <algorithm>
@@ -13,12 +15,13 @@ namespace {
 
 constexpr auto K = CODE_MARK::Computed;
 constexpr auto R = CODE_MARK::Recalled;
-constexpr const char* kForce = "ASCE 41-17 7.5.3.2";
 
-/// The side of the section that the moment compresses.
-bool IsPositiveSide(const T_JUDGED_END& end, const T_END_STATE& s)
+/// Along the shear force.
+double DepthOf(const T_MEMBER_END& member)
 {
-    return (s.M >= 0.0) != IsSectionSignOpposite(end.place.component);
+    const T_SECT_D& s = member.section;
+    const bool round = s.shape == SECT_SHAPE::Circle || s.shape == SECT_SHAPE::Pipe;
+    return s.size[member.aboutY || round ? 0 : 1];
 }
 
 /// M / V of a state on the sheet. A point without a moment close to the end does not make a member
@@ -27,12 +30,12 @@ bool IsPositiveSide(const T_JUDGED_END& end, const T_END_STATE& s)
 double SpanOf(const T_MEMBER_END& member, const T_END_STATE& s, double longest, const char* beyond,
               CCodeSheet& sheet)
 {
-    constexpr double kNothing = 1e-9; // of b h fc: rounding
+    constexpr double kNothing = 1e-9; // of the depth squared times the strength: rounding
     const T_MATL_D& m = member.material;
-    const double M = std::fabs(s.M), V = std::fabs(s.V);
-    const double force = kNothing * member.section.size[0] * member.section.size[1] *
-                         std::max(m.fck, m.mean.value_or(T_MATL_MEAN{}).fc);
-    const double least = std::min(member.section.size[member.aboutY ? 0 : 1], member.clear / 2.0);
+    const T_MATL_MEAN mean = m.mean.value_or(T_MATL_MEAN{});
+    const double M = std::fabs(s.M), V = std::fabs(s.V), depth = DepthOf(member);
+    const double force = kNothing * depth * depth * std::max({m.fck, mean.fc, m.Fy});
+    const double least = std::min(depth, member.clear / 2.0);
     const auto put = [&](double span, const char* text) {
         return sheet.Put("LV", span, kDimLength, "", text, K);
     };
@@ -40,49 +43,6 @@ double SpanOf(const T_MEMBER_END& member, const T_END_STATE& s, double longest, 
         return put(member.clear / 2.0, "no forces: clear length/2");
     if (M >= longest * V) return put(longest, beyond);
     return M < least * V ? put(least, "M/V below: min(h; clear length/2)") : put(M / V, "M/V");
-}
-
-/// The end at the axial force of a state. Rotations go with the chord: it is no longer than the
-/// clear length.
-T_MEMBER_END RotationEnd(const T_JUDGED_END& end, const T_END_STATE& s, CCodeSheet& sheet)
-{
-    T_MEMBER_END member = end.member;
-    member.axial = s.N;
-    member.shearSpan =
-        SpanOf(member, s, member.clear, "M/V beyond the clear length: clear length", sheet);
-    return member;
-}
-
-/// The same for shear: of a moment without shear so long that no formula sees its end.
-T_MEMBER_END ShearEnd(const T_JUDGED_END& end, const T_END_STATE& s, CCodeSheet& sheet)
-{
-    constexpr double kFar = 1000.0; // clear lengths
-    T_MEMBER_END member = end.member;
-    member.axial = s.N;
-    member.shearSpan = SpanOf(member, s, kFar * member.clear, "no shear", sheet);
-    return member;
-}
-
-/// The lines and warnings of a sheet of shear.
-void KeepShear(const CCodeSheet& sheet, T_END_CHECKS& out)
-{
-    out.shearTrace = sheet.Trace();
-    out.warnings.insert(out.warnings.end(), sheet.Warnings().begin(), sheet.Warnings().end());
-}
-
-// ---- EN 1998-3, Circolare 2019 ------------------------------------------------------------------
-
-std::optional<T_EN_ROTATIONS> RotationsOf(const T_MEMBER_END& member, bool positive,
-                                          CCodeSheet& sheet)
-{
-    const std::optional<T_RC_BASIS> basis = RcBasis(member, positive, sheet);
-    const auto en = basis ? EnMember(*basis, sheet) : std::nullopt;
-    const auto monotonic = en ? EnMonotonicShear(*basis, basis->material, sheet) : std::nullopt;
-    if (!monotonic) return {};
-    T_EN_HINGE_IN in;
-    in.member = *en;
-    in.concreteShear = monotonic->concrete;
-    return EnRotations(in, sheet);
 }
 
 /// A free or pinned end turns without being bent.
@@ -93,185 +53,198 @@ bool IsWithoutMoment(const T_MEMBER_END& member, const T_END_STATE& s)
     return s.flowed == 0.0 && V > 0.0 && std::fabs(s.M) <= kNothing * V * member.clear;
 }
 
-void ChordRotations(const T_JUDGED_END& end, const T_END_STATE& s, T_END_CHECKS& out)
+/// The deformation of the hinge against its own criteria.
+void CheckCriteria(const T_CHECKING& c, T_MODE_CHECK& check)
 {
-    CCodeSheet sheet;
-    const T_MEMBER_END member = RotationEnd(end, s, sheet);
-    out.LV = member.shearSpan;
-    const auto found = RotationsOf(member, IsPositiveSide(end, s), sheet);
-    if (!found) {
-        out.whyNoRotation = ReasonOf(sheet);
-        return;
-    }
-    const bool isFree = IsWithoutMoment(member, s);
-    const double theta = sheet.Put("theta", isFree ? 0.0 : std::fabs(s.chord), "EN 1998-3 A.3.1",
-                                   isFree ? "no moment: the end is not bent"
-                                          : "rotation of the end less that of the chord",
-                                   K);
-    const T_CHORD_LIMITS& limits = found->limits;
-    const std::array<double, kLevels> capacity{limits.DL, limits.SD, limits.NC};
-    for (std::size_t i = 0; i < kLevels; ++i)
-        out.rotation[i] = T_CHECK{theta, capacity[i]};
-    out.thetaY = found->thetaY;
-    out.ductility = sheet.Put("mu_theta", theta / out.thetaY, "", "theta/theta_y", K);
-    out.rotationTrace = sheet.Trace();
-    out.warnings = sheet.Warnings();
-}
-
-/// VR of (A.12) with the strengths of brittle checks; the compression zone is that of the means.
-void ChordShear(const T_JUDGED_END& end, const T_STATE_CONTEXT& with, T_END_CHECKS& out)
-{
-    CCodeSheet sheet;
-    const T_END_STATE& s = with.shear;
-    const T_MEMBER_END member = ShearEnd(end, s, sheet);
-    const std::optional<T_RC_BASIS> basis = RcBasis(member, IsPositiveSide(end, s), sheet);
-    const auto en = basis ? EnMember(*basis, sheet) : std::nullopt;
-    const auto yield = en ? EnYield(*en, sheet) : std::nullopt;
-    if (!yield) {
-        out.whyNoShear = ReasonOf(sheet);
-        return;
-    }
-    T_RC_MATERIAL material = basis->material;
-    const char* const clause =
-        end.member.code == HINGE_CODE::En1998 ? "EN 1998-3 A.3.3.1" : "Circolare 2019 C8.7.2.3.5";
-    material.fc = sheet.Put("fc", material.fc / with.factors.gammaC, kDimStress, clause,
-                            "mean.fc/(CF " + CodeNumber(with.factors.gammaC) + ")", R);
-    material.fyw = sheet.Put("fyw", material.fyw / with.factors.gammaS, kDimStress, clause,
-                             "mean.fyw/(CF " + CodeNumber(with.factors.gammaS) + ")", R);
-    T_EN_MEMBER brittle = *en;
-    brittle.fc = material.fc;
-    brittle.fyw = material.fyw;
-    const auto cyclic = EnCyclicShear(brittle, yield->xi * en->d,
-                                      std::max(0.0, out.ductility - 1.0), std::nullopt, sheet);
-    const auto monotonic = cyclic ? EnMonotonicShear(*basis, material, sheet) : std::nullopt;
-    if (!monotonic) {
-        out.whyNoShear = ReasonOf(sheet);
-        return;
-    }
-    const double strength =
-        sheet.Put("VR", std::min(cyclic->strength, monotonic->strut), kDimForce,
-                  "EN 1998-3 A.3.3.1", "min(VR; VRd,max), 45 degrees", CODE_MARK::SightedOnce);
-    out.shear.fill(T_CHECK{std::fabs(s.V), strength});
-    KeepShear(sheet, out);
-}
-
-// ---- ASCE 41, FEMA 356 --------------------------------------------------------------------------
-
-/// Of the knowledge level; a material without one counts as the least known.
-double KappaOf(const T_MEMBER_END& member, CCodeSheet& sheet)
-{
-    const auto& level = member.material.knowledge;
-    return AsceKappa(level ? static_cast<ASCE_KNOWLEDGE>(*level) : ASCE_KNOWLEDGE::Minimum, sheet);
-}
-
-void PlasticRotations(const T_JUDGED_END& end, const T_END_STATE& s, T_END_CHECKS& out)
-{
-    CCodeSheet sheet;
-    const T_MEMBER_END member = ShearEnd(end, s, sheet);
-    T_SIDES<T_CODE_SIDE> sides;
-    if (!RcHinge(member, sides, out.whyNoRotation)) return;
-    const T_CODE_SIDE& side = IsPositiveSide(end, s) ? sides.pos : sides.neg;
-    if (!side.bone.acceptance) {
-        out.whyNoRotation = Say("IDS_QM_GEN_NO_ANSWER");
-        return;
-    }
-    out.rotationTrace = side.trace;
-    out.warnings = side.warnings;
-    std::erase_if(out.warnings, // of the hinge's own shear, which is judged here
-                  [](const T_CODE_WARNING& w) { return w.key == "IDS_QM_GEN_WARN_SHEAR"; });
-    out.LV = member.shearSpan;
-    out.thetaY = side.bone.yieldDeform;
-    const double elastic = end.spring > 0.0 ? s.hingeMoment / end.spring : 0.0;
-    const double theta = sheet.Put("theta_pl", std::fabs(s.flowed - elastic), "",
-                                   "rotation of the hinge beyond yield", K);
-    const double kappa = KappaOf(member, sheet);
-    for (std::size_t i = 0; i < kLevels; ++i) {
-        const double capacity = kappa * side.bone.Plastic((*side.bone.acceptance)[i]);
-        out.rotation[i] =
-            T_CHECK{theta, sheet.Put(std::string("kappa ") + kLevelNames[0][i], capacity,
-                                     "ASCE 41-17 7.5.3.2.1", "kappa times the table", R)};
-    }
-    out.ductility =
-        sheet.Put("ductility", 1.0 + theta / out.thetaY, "", "(theta_y + theta_pl)/theta_y", K);
-    out.rotationTrace.insert(out.rotationTrace.end(), sheet.Trace().begin(), sheet.Trace().end());
-}
-
-/// Strength with lower-bound strengths, times kappa.
-std::optional<double> ForceStrength(const T_JUDGED_END& end, const T_END_STATE& s, double ductility,
-                                    CCodeSheet& sheet)
-{
-    const T_MEMBER_END member = ShearEnd(end, s, sheet);
-    const T_MATL_D& m = member.material;
-    const std::optional<T_RC_BASIS> basis = RcBasis(member, IsPositiveSide(end, s), sheet);
-    if (!basis || !sheet.Positive({{"fck", m.fck}, {"fyk", m.fyk}})) return {};
-    T_RC_MATERIAL lower = basis->material;
-    lower.fc = sheet.Put("f'cL", m.fck, kDimStress, kForce, "lower bound: fck", R);
-    lower.fyw = sheet.Put("fytL", m.fyk, kDimStress, kForce, "lower bound: fyk", R);
-    std::optional<double> strength;
-    if (IsUpright(member.kind)) {
-        if (const auto found = AsceColumnShearOf(*basis, lower, ductility, sheet))
-            strength = found->strength;
-    } else if (const auto found = AsceBeamShear(*basis, lower, sheet)) {
-        strength = found->Vn;
-    }
-    if (!strength) return {};
-    return sheet.Put("kappa QCL", KappaOf(member, sheet) * *strength, kDimForce, kForce,
-                     "kappa times the strength", R);
-}
-
-void ForceShear(const T_JUDGED_END& end, const T_STATE_CONTEXT& with, T_END_CHECKS& out)
-{
-    if (!with.gravityShear) {
-        out.whyNoShear = Say("IDS_QM_JUDGE_NO_GRAVITY");
-        return;
-    }
-    CCodeSheet sheet;
-    const double gravity = *with.gravityShear;
-    const std::optional<double> strength = ForceStrength(end, with.shear, out.ductility, sheet);
-    if (!strength) {
-        out.whyNoShear = ReasonOf(sheet);
-        return;
-    }
-    constexpr std::array<double, kLevels> kChi{1.3, 1.3, 1.0}; // IO, LS, CP
-    sheet.Put("QG", std::fabs(gravity), kDimForce, "", "shear of the initial loads", K);
-    sheet.Put("gamma", with.factors.gamma, kForce, "1.3: critical action", R);
-    for (std::size_t i = 0; i < kLevels; ++i) {
-        const double factor = with.factors.gamma * kChi[i];
-        const double demand = std::fabs(factor * (with.shear.V - gravity) + gravity);
-        sheet.Put(std::string("QUF* ") + kLevelNames[0][i], demand, kDimForce, kForce,
-                  "gamma chi (QUF - QG) + QG, chi = " + CodeNumber(kChi[i]), R);
-        out.shear[i] = T_CHECK{demand, *strength};
-    }
-    KeepShear(sheet, out);
-}
-
-// ---- the criteria of a hinge --------------------------------------------------------------------
-
-void HingeRotations(const T_JUDGED_END& end, const T_END_STATE& s, T_END_CHECKS& out)
-{
-    out.whyNoShear = Say("IDS_QM_JUDGE_NO_SHEAR");
-    const std::vector<double>& marks = s.flowed < 0.0 ? end.marks.neg : end.marks.pos;
+    const double flowed = c.state.flowed;
+    const std::vector<double>& marks = flowed < 0.0 ? c.end.marks.neg : c.end.marks.pos;
     if (marks.size() < kLevels) {
-        out.whyNoRotation = Say("IDS_QM_JUDGE_NO_CRITERIA");
+        check.why = Say("IDS_QM_JUDGE_NO_CRITERIA");
         return;
     }
     for (std::size_t i = 0; i < kLevels; ++i)
-        out.rotation[i] = T_CHECK{std::fabs(s.flowed), marks[i]};
+        check.at[i] = T_CHECK{std::fabs(flowed), marks[i]};
+}
+
+void CheckByCode(const T_CHECKING& c)
+{
+    if (c.end.kind == JUDGED_KIND::Joint) return CheckJointOf(c);
+    if (c.end.kind == JUDGED_KIND::Brace) return CheckBrace(c);
+    switch (c.end.member.material.type) {
+    case MATL_CLASS::Steel:
+        return CheckSteel(c);
+    case MATL_CLASS::Masonry:
+        return CheckMasonry(c);
+    default:
+        return CheckConcrete(c); // refuses what is no concrete
+    }
 }
 
 } // namespace
 
+// ---- shared -------------------------------------------------------------------------------------
+
+bool IsPositiveSide(const T_JUDGED_END& end, const T_END_STATE& s)
+{
+    return (s.M >= 0.0) != IsSectionSignOpposite(end.place.component);
+}
+
+T_MEMBER_END RotationEnd(const T_JUDGED_END& end, const T_END_STATE& s, CCodeSheet& sheet)
+{
+    T_MEMBER_END member = end.member;
+    member.axial = s.N;
+    member.shearSpan =
+        SpanOf(member, s, member.clear, "M/V beyond the clear length: clear length", sheet);
+    return member;
+}
+
+T_MEMBER_END ShearEnd(const T_JUDGED_END& end, const T_END_STATE& s, CCodeSheet& sheet)
+{
+    constexpr double kFar = 1000.0; // clear lengths
+    T_MEMBER_END member = end.member;
+    member.axial = s.N;
+    member.shearSpan = SpanOf(member, s, kFar * member.clear, "no shear", sheet);
+    return member;
+}
+
+std::optional<T_CODE_SIDE> GeneratedSide(const T_MEMBER_END& member, bool positive,
+                                         std::string& reason)
+{
+    T_SIDES<T_CODE_SIDE> sides;
+    int done = 0;
+    switch (member.material.type) {
+    case MATL_CLASS::Steel:
+        done = SteelHinge(member, sides, reason);
+        break;
+    case MATL_CLASS::Masonry:
+        done = MasonryHinge(member, sides, reason);
+        break;
+    default:
+        done = RcHinge(member, sides, reason);
+    }
+    if (done == 0) return {};
+    T_CODE_SIDE& side = positive ? sides.pos : sides.neg;
+    if (!side.bone.acceptance) {
+        reason = Say("IDS_QM_GEN_NO_ANSWER");
+        return {};
+    }
+    std::erase_if(side.warnings, // of the hinge's own shear, which is judged here
+                  [](const T_CODE_WARNING& w) { return w.key == "IDS_QM_GEN_WARN_SHEAR"; });
+    return std::move(side);
+}
+
+std::string ClauseOf(const std::vector<T_CODE_TRACE>& trace,
+                     std::initializer_list<std::string_view> symbols)
+{
+    for (const std::string_view symbol : symbols) {
+        const auto at = std::find_if(trace.rbegin(), trace.rend(), [&](const T_CODE_TRACE& line) {
+            return line.symbol == symbol;
+        });
+        if (at != trace.rend()) return at->clause;
+    }
+    return {};
+}
+
+void Keep(const CCodeSheet& sheet, T_MODE_CHECK& check, T_END_CHECKS& out)
+{
+    check.trace.insert(check.trace.end(), sheet.Trace().begin(), sheet.Trace().end());
+    out.warnings.insert(out.warnings.end(), sheet.Warnings().begin(), sheet.Warnings().end());
+}
+
+double ChordDemand(const T_CHECKING& c, const T_MEMBER_END& member, CCodeSheet& sheet)
+{
+    const bool isFree = IsWithoutMoment(member, c.state);
+    return sheet.Put("theta", isFree ? 0.0 : std::fabs(c.state.chord), "EN 1998-3 A.3.1",
+                     isFree ? "no moment: the end is not bent"
+                            : "rotation of the end less that of the chord",
+                     K);
+}
+
+void GeneratedChord(const T_CHECKING& c)
+{
+    T_MODE_CHECK& check = c.Of(JUDGE_MODE::Rotation);
+    CCodeSheet span, sheet;
+    const T_MEMBER_END member = RotationEnd(c.end, c.state, span);
+    c.out.LV = member.shearSpan;
+    const auto side = GeneratedSide(member, IsPositiveSide(c.end, c.state), check.why);
+    if (!side) return;
+    Keep(span, check, c.out);
+    check.trace.insert(check.trace.end(), side->trace.begin(), side->trace.end());
+    c.out.warnings.insert(c.out.warnings.end(), side->warnings.begin(), side->warnings.end());
+    const double theta = ChordDemand(c, member, sheet);
+    for (std::size_t i = 0; i < kLevels; ++i) {
+        check.at[i] = T_CHECK{theta, (*side->bone.acceptance)[i]};
+        check.clause[i] =
+            ClauseOf(check.trace, {kLevelNames[1][i], i == 0 ? "theta_y" : "theta_um"});
+    }
+    c.out.thetaY = side->bone.yieldDeform;
+    c.out.ductility = sheet.Put("mu_theta", theta / c.out.thetaY, "", "theta/theta_y", K);
+    Keep(sheet, check, c.out);
+}
+
+void PlasticRotations(const T_CHECKING& c, double axial)
+{
+    T_MODE_CHECK& check = c.Of(JUDGE_MODE::Rotation);
+    CCodeSheet span, sheet;
+    T_MEMBER_END member = ShearEnd(c.end, c.state, span);
+    member.axial = axial;
+    const auto side = GeneratedSide(member, IsPositiveSide(c.end, c.state), check.why);
+    if (!side) return;
+    check.trace = side->trace;
+    check.trace.insert(check.trace.end(), span.Trace().begin(), span.Trace().end());
+    c.out.warnings = side->warnings;
+    c.out.LV = member.shearSpan;
+    c.out.thetaY = side->bone.yieldDeform;
+    const T_END_STATE& s = c.state;
+    const double elastic = c.end.spring > 0.0 ? s.hingeMoment / c.end.spring : 0.0;
+    const double theta = sheet.Put("theta_pl", std::fabs(s.flowed - elastic), "",
+                                   "rotation of the hinge beyond yield", K);
+    const double kappa = KappaOf(member.material, sheet);
+    for (std::size_t i = 0; i < kLevels; ++i) {
+        const char* const level = kLevelNames[0][i];
+        const double capacity = kappa * side->bone.Plastic((*side->bone.acceptance)[i]);
+        check.at[i] = T_CHECK{theta, sheet.Put(std::string("kappa ") + level, capacity,
+                                               "ASCE 41-17 7.5.3.2.1", "kappa times the table", R)};
+        check.clause[i] = ClauseOf(check.trace, {level});
+    }
+    c.out.ductility =
+        sheet.Put("ductility", 1.0 + theta / c.out.thetaY, "", "(theta_y + theta_pl)/theta_y", K);
+    check.trace.insert(check.trace.end(), sheet.Trace().begin(), sheet.Trace().end());
+}
+
+double KappaOf(const T_MATL_D& material, CCodeSheet& sheet)
+{
+    const auto& level = material.knowledge;
+    return AsceKappa(level ? static_cast<ASCE_KNOWLEDGE>(*level) : ASCE_KNOWLEDGE::Minimum, sheet);
+}
+
+std::array<double, kLevels> ForceDemands(const char* symbol, double force, double gravity,
+                                         T_DIM dim, double gamma, CCodeSheet& sheet)
+{
+    constexpr std::array<double, kLevels> kChi{1.3, 1.3, 1.0}; // IO, LS, CP
+    std::array<double, kLevels> out{};
+    sheet.Put(std::string(symbol) + "G", gravity, dim, "", "of the initial loads", K);
+    sheet.Put("gamma", gamma, kForceClause, "1.3: critical action", R);
+    for (std::size_t i = 0; i < kLevels; ++i)
+        out[i] = sheet.Put(std::string(symbol) + "UF* " + kLevelNames[0][i],
+                           gamma * kChi[i] * (force - gravity) + gravity, dim, kForceClause,
+                           "gamma chi (QUF - QG) + QG, chi = " + CodeNumber(kChi[i]), R);
+    return out;
+}
+
+// ---- what is judged -----------------------------------------------------------------------------
+
 const T_LEVELS& T_JUDGED_END::Levels() const
 {
-    if (basis != JUDGE_BASIS::Code || !IsChordCode(member.code)) return kLevelNames[0];
-    return kLevelNames[member.code == HINGE_CODE::En1998 ? 1 : 2];
+    if (basis != JUDGE_BASIS::Code || !IsChordCode(By())) return kLevelNames[0];
+    return kLevelNames[By() == HINGE_CODE::En1998 ? 1 : 2];
 }
 
 std::string T_JUDGED_END::Code() const
 {
     if (basis == JUDGE_BASIS::Criteria) return Say("IDS_QM_JUDGE_CRITERIA");
     if (basis == JUDGE_BASIS::Nothing) return {};
-    return kHingeCodeNames[static_cast<std::size_t>(member.code)];
+    return kHingeCodeNames[static_cast<std::size_t>(By())];
 }
 
 std::optional<double> T_CHECK::Ratio() const
@@ -280,29 +253,56 @@ std::optional<double> T_CHECK::Ratio() const
     return demand > 0.0 ? std::nullopt : std::optional(0.0);
 }
 
+const T_MODE_CHECK* T_END_CHECKS::Of(JUDGE_MODE mode) const
+{
+    const auto at = std::ranges::find(modes, mode, &T_MODE_CHECK::mode);
+    return at == modes.end() ? nullptr : &*at;
+}
+
+T_MODE_CHECK* T_END_CHECKS::Of(JUDGE_MODE mode)
+{
+    const auto at = std::ranges::find(modes, mode, &T_MODE_CHECK::mode);
+    return at == modes.end() ? nullptr : &*at;
+}
+
+std::optional<T_CHECK> T_END_CHECKS::At(JUDGE_MODE mode, std::size_t level) const
+{
+    const T_MODE_CHECK* const check = Of(mode);
+    return check ? check->at[level] : std::nullopt;
+}
+
+std::vector<JUDGE_MODE> ModesOf(const T_JUDGED_END& end)
+{
+    using enum JUDGE_MODE;
+    if (end.kind == JUDGED_KIND::Joint) return {Joint};
+    if (end.kind == JUDGED_KIND::Brace) return {Elongation};
+    const bool code = end.basis == JUDGE_BASIS::Code;
+    if (code && end.member.material.type == MATL_CLASS::Steel && end.member.HasAxial())
+        return {Rotation, Shear, Axial};
+    // A hinge of shear in masonry keeps its strength up to a drift, which rotation is judged by.
+    if (code && end.member.material.type == MATL_CLASS::Masonry && end.shearHinge)
+        return {Rotation};
+    return {Rotation, Shear};
+}
+
 T_END_CHECKS CheckEnd(const T_JUDGED_END& end, const T_END_STATE& s, const T_STATE_CONTEXT& with)
 {
     T_END_CHECKS out;
-    if (end.basis == JUDGE_BASIS::Nothing) {
-        out.whyNoRotation = out.whyNoShear = end.why;
-        return out;
+    for (const JUDGE_MODE mode : ModesOf(end)) {
+        T_MODE_CHECK& check = out.modes.emplace_back();
+        check.mode = mode;
+        check.dim = mode == JUDGE_MODE::Rotation     ? kDimNone
+                    : mode == JUDGE_MODE::Elongation ? kDimLength
+                                                     : kDimForce;
+        if (end.basis == JUDGE_BASIS::Nothing) check.why = end.why;
+        if (end.basis == JUDGE_BASIS::Criteria && mode == JUDGE_MODE::Shear)
+            check.why = Say("IDS_QM_JUDGE_NO_SHEAR");
     }
-    if (end.basis == JUDGE_BASIS::Criteria) {
-        HingeRotations(end, s, out);
-        return out;
-    }
-    const bool chord = IsChordCode(end.member.code);
-    if (chord)
-        ChordRotations(end, s, out);
-    else
-        PlasticRotations(end, s, out);
-    if (!out.whyNoRotation.empty()) {
-        out.whyNoShear = out.whyNoRotation; // the ductility of its strength is not known
-        return out;
-    }
-    if (chord)
-        ChordShear(end, with, out);
-    else
-        ForceShear(end, with, out);
+    const T_CHECKING c{end, s, with, out};
+    if (end.basis == JUDGE_BASIS::Criteria) CheckCriteria(c, out.modes.front());
+    if (end.basis == JUDGE_BASIS::Code) CheckByCode(c);
+    for (T_MODE_CHECK& check : out.modes)
+        for (const T_CODE_TRACE& line : check.trace)
+            check.leastSure = std::max(check.leastSure, line.mark);
     return out;
 }

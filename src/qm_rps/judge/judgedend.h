@@ -1,14 +1,15 @@
-// What a member end can take, and the share of it that a step takes: rotations and shear by a
-// code. SI.
+// What a member end, a brace or a joint can take, and the share of it that a step takes. SI.
 #pragma once
 
 #include "qm_rps/generate/memberend.h"
-#include "qm_rps/judge/endstate.h"
+#include "qm_rps/judge/judgedjoint.h"
 
-/// What an end is judged by.
+#include <memory>
+
+/// What something is judged by.
 enum class JUDGE_BASIS {
     Nothing,  // there is a reason
-    Code,     // a code, from section and reinforcement
+    Code,     // a code, from section and material
     Criteria, // the acceptance criteria of its hinge
 };
 
@@ -18,28 +19,40 @@ using T_LEVELS = std::array<const char*, kLevels>;
 inline constexpr std::array<T_LEVELS, 3> kLevelNames{
     {{"IO", "LS", "CP"}, {"DL", "SD", "NC"}, {"SLD", "SLV", "SLC"}}};
 
-enum class JUDGE_MODE { Rotation, Shear };
-inline constexpr std::array<const char*, 2> kModeNames{"rotation", "shear"};
+/// Rotation and shear of member ends, of steel columns the axial force (with bending where no
+/// rotation may be counted on); the elongation of braces; the shear of joints.
+enum class JUDGE_MODE { Rotation, Shear, Axial, Elongation, Joint };
+inline constexpr std::size_t kModes = 5;
+inline constexpr std::array<const char*, kModes> kModeNames{"rotation", "shear", "axial_force",
+                                                            "elongation", "joint"};
 
 /// Partial factors of brittle checks.
 struct T_JUDGE_FACTORS {
-    double gammaC = 1.5, gammaS = 1.15; // EN 1998-3, Circolare: strengths in shear
+    double gammaC = 1.5, gammaS = 1.15; // EN 1998-3, Circolare: strengths in shear, of joints
     double gamma = 1.3;                 // ASCE 41: force-controlled actions
     bool operator==(const T_JUDGE_FACTORS&) const = default;
 };
 
+enum class JUDGED_KIND { End, Brace, Joint };
+
+/// One end of a member about one axis; a whole brace; a joint in one plane.
 struct T_JUDGED_END {
-    T_END_PLACE place;
+    JUDGED_KIND kind = JUDGED_KIND::End;
+    T_END_PLACE place; // of a joint: its column
     T_MEMBER_AXES axes;
     bool column = false;
     std::string storey; // empty: none
     JUDGE_BASIS basis = JUDGE_BASIS::Nothing;
     std::string why;                    // Nothing: the reason
-    T_MEMBER_END member;                // Code
+    T_MEMBER_END member;                // Code, but for joints
     T_SIDES<std::vector<double>> marks; // Criteria: deformations of the hinge at IO, LS, CP
     double spring = 0.0;                // stiffness of its hinge in series, 0: rigid until it flows
     long hinge = -1;                    // of the run
+    bool shearHinge = false;            // the member has one: its shear is a matter of deformations
+    std::shared_ptr<const T_JUDGED_JOINT> joint{}; // Joint
 
+    /// The code of Code.
+    HINGE_CODE By() const { return joint ? joint->joint.code : member.code; }
     const T_LEVELS& Levels() const;
     std::string Code() const; // "EN1998-3", "hinge type", ""
 };
@@ -52,36 +65,52 @@ struct T_CHECK {
     bool Holds() const { return demand <= capacity; }
 };
 
-/// The checks of an end in a state.
+/// One mode of failure at all limit states.
+struct T_MODE_CHECK {
+    JUDGE_MODE mode = JUDGE_MODE::Rotation;
+    T_DIM dim{}; // of demand and capacity
+    std::array<std::optional<T_CHECK>, kLevels> at;
+    std::array<std::string, kLevels> clause; // that the capacity comes from
+    std::string why;                         // there are no numbers
+    std::vector<T_CODE_TRACE> trace;
+    CODE_MARK leastSure = CODE_MARK::Computed;
+};
+
+/// The checks of something in a state.
 struct T_END_CHECKS {
-    double LV = 0.0;        // shear span that the rotations took; 0: none
-    double thetaY = 0.0;    // 0: not known
-    double ductility = 0.0; // theta / theta_y; 0: not known
-    std::array<std::optional<T_CHECK>, kLevels> rotation, shear;
-    std::string whyNoRotation, whyNoShear;
-    std::vector<T_CODE_TRACE> rotationTrace, shearTrace;
+    double LV = 0.0;                 // shear span that the rotations took; 0: none
+    double thetaY = 0.0;             // 0: not known
+    double ductility = 0.0;          // theta / theta_y; 0: not known
+    std::vector<T_MODE_CHECK> modes; // those that apply
     std::vector<T_CODE_WARNING> warnings;
 
-    const std::optional<T_CHECK>& Of(JUDGE_MODE mode, std::size_t level) const
-    {
-        return mode == JUDGE_MODE::Rotation ? rotation[level] : shear[level];
-    }
+    /// Null: the mode does not apply.
+    const T_MODE_CHECK* Of(JUDGE_MODE mode) const;
+    T_MODE_CHECK* Of(JUDGE_MODE mode);
+    /// Empty: it does not apply, or is not known.
+    std::optional<T_CHECK> At(JUDGE_MODE mode, std::size_t level) const;
 };
 
 /// What a state is judged with besides itself.
 struct T_STATE_CONTEXT {
-    T_END_STATE shear;                    // where the shear demand is read
-    std::optional<double> gravityShear{}; // of the initial loads; empty: not known
+    T_END_STATE brittle;                  // where demands of brittle checks are read
+    std::optional<T_END_STATE> gravity{}; // under the initial loads; empty: not known
     T_JUDGE_FACTORS factors;
 };
 
+/// Modes that apply, in their order.
+std::vector<JUDGE_MODE> ModesOf(const T_JUDGED_END& end);
+
 /// Rotations: EN 1998-3, Circolare: |chord rotation| against DL, SD, NC at N and LV = M / V of the
-/// state. ASCE 41, FEMA 356: plastic rotation against kappa times IO, LS, CP at N. Criteria: the
-/// deformation of the hinge against its own.
+/// state. ASCE 41, FEMA 356: plastic rotation against kappa times IO, LS, CP at N (41-17, columns
+/// of steel: at N of the initial loads). Masonry: |chord rotation| against the drift of the mode
+/// that comes first. Criteria: the deformation of the hinge against its own.
 /// LV is at least the depth of the section, or half the clear length of a squat member (a moment
 /// that is almost 0 says nothing of either); of rotations at most the clear length.
 /// Shear: EN 1998-3 (A.12) with the strengths over CF and gamma_M, at the ductility theta / theta_y
-/// of the state; VRd,max of EN 1992-1-1. ASCE 41-17 7.5.3.2: gamma chi (V - VG) + VG against kappa
-/// times the strength with lower-bound strengths.
+/// of the state, VRd,max of EN 1992-1-1; steel EN 1993-1-1 6.2.6. ASCE 41-17 7.5.3.2: gamma chi
+/// (V - VG) + VG against kappa times the strength with lower-bound strengths.
+/// Axial force of steel columns: buckling; where the code counts on no rotation AISC 360 H1-1,
+/// EN 1993-1-1 6.2.9 instead of rotations. Joints: CheckJoint.
 T_END_CHECKS CheckEnd(const T_JUDGED_END& end, const T_END_STATE& state,
                       const T_STATE_CONTEXT& with);

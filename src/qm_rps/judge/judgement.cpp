@@ -8,14 +8,12 @@
 
 namespace {
 
-constexpr std::array<JUDGE_MODE, 2> kModes{JUDGE_MODE::Rotation, JUDGE_MODE::Shear};
-
-T_STATE_CONTEXT ContextOf(const T_JUDGED_PATH& path, std::size_t end, const T_END_STATE& shear,
+T_STATE_CONTEXT ContextOf(const T_JUDGED_PATH& path, std::size_t end, const T_END_STATE& brittle,
                           const T_JUDGE_FACTORS& factors)
 {
     T_STATE_CONTEXT with;
-    with.shear = shear;
-    if (path.hasStart) with.gravityShear = path.ends.front()[end].V;
+    with.brittle = brittle;
+    if (path.hasStart) with.gravity = path.ends.front()[end];
     with.factors = factors;
     return with;
 }
@@ -32,8 +30,8 @@ void Conclude(std::size_t level, T_JUDGED_ROW& row)
 {
     bool isWhole = true, holds = true;
     const T_CHECK* worst = nullptr;
-    for (const JUDGE_MODE mode : kModes) {
-        const std::optional<T_CHECK>& check = row.checks.Of(mode, level);
+    for (const T_MODE_CHECK& mode : row.checks.modes) {
+        const std::optional<T_CHECK>& check = mode.at[level];
         if (!check) {
             isWhole = false;
             continue;
@@ -41,7 +39,7 @@ void Conclude(std::size_t level, T_JUDGED_ROW& row)
         holds = holds && check->Holds();
         if (worst && !Governs(*check, *worst)) continue;
         worst = &*check;
-        row.governing = mode;
+        row.governing = mode.mode;
     }
     if (worst) row.ratio = worst->Ratio();
     row.verdict = !holds    ? VERDICT::NotFulfilled
@@ -84,8 +82,8 @@ struct T_PIECE {
 
 bool Passes(const T_END_CHECKS& checks, JUDGE_MODE mode, std::size_t level)
 {
-    const std::optional<T_CHECK>& check = checks.Of(mode, level);
-    return check && !check->Holds();
+    const T_MODE_CHECK* const check = checks.Of(mode);
+    return check && check->at[level] && !check->at[level]->Holds();
 }
 
 /// Share of the piece at which the end passes the limit; it does at its end.
@@ -104,11 +102,11 @@ double ShareOf(const T_PIECE& piece, JUDGE_MODE mode, std::size_t level)
 
 bool ReadsShearAtPeak(const T_JUDGED_END& end)
 {
-    return end.basis == JUDGE_BASIS::Code && end.member.code == HINGE_CODE::Circolare2019;
+    return end.basis == JUDGE_BASIS::Code && end.By() == HINGE_CODE::Circolare2019;
 }
 
 void JudgeState(const std::vector<T_JUDGED_END>& ends, const T_JUDGED_PATH& path, std::size_t index,
-                const T_JUDGE_FACTORS& factors, T_JUDGED_STATE& state)
+                const T_JUDGE_OPTIONS& options, T_JUDGED_STATE& state)
 {
     const std::size_t shearIndex = std::min(index, LargestShearAt(path));
     for (std::size_t e = 0; e < ends.size(); ++e) {
@@ -116,7 +114,11 @@ void JudgeState(const std::vector<T_JUDGED_END>& ends, const T_JUDGED_PATH& path
         row.end = e;
         row.state = path.ends[index][e];
         row.shearState = path.ends[ReadsShearAtPeak(ends[e]) ? shearIndex : index][e];
-        row.checks = CheckEnd(ends[e], row.state, ContextOf(path, e, row.shearState, factors));
+        row.checks =
+            CheckEnd(ends[e], row.state, ContextOf(path, e, row.shearState, options.factors));
+        if (!options.trace)
+            for (T_MODE_CHECK& mode : row.checks.modes)
+                mode.trace = {};
         Conclude(state.level, row);
         ++state.all.count[static_cast<std::size_t>(row.verdict)];
         auto storey = std::ranges::find(state.storeys, ends[e].storey, &T_VERDICT_COUNT::storey);
@@ -133,10 +135,16 @@ void JudgeState(const std::vector<T_JUDGED_END>& ends, const T_JUDGED_PATH& path
 std::vector<T_FIRST_PASS> FirstPasses(const std::vector<T_JUDGED_END>& ends,
                                       const T_JUDGED_PATH& path, const T_JUDGE_FACTORS& factors)
 {
+    std::array<std::size_t, kModes> having{};
+    for (const T_JUDGED_END& end : ends)
+        for (const JUDGE_MODE mode : ModesOf(end))
+            ++having[static_cast<std::size_t>(mode)];
     std::vector<T_FIRST_PASS> out;
     for (std::size_t level = 0; level < kLevels; ++level)
-        for (const JUDGE_MODE mode : kModes)
-            out.push_back({level, mode, {}, false, 0.0, 0.0, 0});
+        for (std::size_t mode = 0; mode < kModes; ++mode)
+            if (having[mode] > 0)
+                out.push_back(
+                    {level, static_cast<JUDGE_MODE>(mode), {}, false, 0.0, 0.0, 0, having[mode]});
     const std::size_t peak = LargestShearAt(path);
     for (std::size_t i = 0; i < path.displacement.size(); ++i) {
         std::vector<double> share(out.size(), 2.0); // of the piece before the state; 2: none
@@ -144,7 +152,8 @@ std::vector<T_FIRST_PASS> FirstPasses(const std::vector<T_JUDGED_END>& ends,
             const T_END_CHECKS now = T_PIECE{ends[e], path, e, i, peak, factors}.At(0.0);
             for (std::size_t k = 0; k < out.size(); ++k) {
                 T_FIRST_PASS& first = out[k];
-                if (i == 0 && !now.Of(first.mode, first.level)) ++first.unchecked;
+                const T_MODE_CHECK* const check = now.Of(first.mode);
+                if (i == 0 && check && !check->at[first.level]) ++first.unchecked;
                 if ((first.end && share[k] > 1.0) || !Passes(now, first.mode, first.level))
                     continue;
                 const T_PIECE piece{ends[e], path, e, i == 0 ? 0 : i - 1, peak, factors};

@@ -14,7 +14,7 @@ struct T_JUDGED_ROW {
     std::size_t end = 0; // of the judgement's ends
     T_END_STATE state, shearState;
     T_END_CHECKS checks;
-    VERDICT verdict = VERDICT::NotChecked; // of both modes
+    VERDICT verdict = VERDICT::NotChecked; // of all modes
     JUDGE_MODE governing = JUDGE_MODE::Rotation;
     std::optional<double> ratio; // of the governing mode; empty: not checked, or no capacity
 };
@@ -44,7 +44,8 @@ struct T_FIRST_PASS {
     std::optional<std::size_t> end; // empty: none does, up to the end of the push
     bool atStart = false;           // passed in the first state already
     double displacement = 0.0, baseReaction = 0.0;
-    std::size_t unchecked = 0; // ends without this check: one of them may be the first
+    std::size_t unchecked = 0; // that have this mode without numbers: one may be the first
+    std::size_t all = 0;       // that have this mode
 };
 
 /// Codes of the ends, or one for all.
@@ -53,25 +54,30 @@ struct T_JUDGE_OPTIONS {
     bool secondary = false;           // with `code`: members
     std::optional<std::size_t> level; // this one alone
     T_JUDGE_FACTORS factors;
+    bool trace = false; // keep the numbers behind every check
     bool operator==(const T_JUDGE_OPTIONS&) const = default;
 };
 
 /// The ends of the beam elements: about the axes that a code or their hinges bend them, else one
-/// row that says why there is nothing to judge. `run`: its hinges and storeys.
+/// row that says why there is nothing to judge; braces; then the joints of columns with beams by
+/// their nodes, in each plane that has beams. `run`: its hinges and storeys.
 std::vector<T_JUDGED_END> JudgedEnds(const T_MODEL& model, const T_PUSH_RUN& run,
                                      const T_JUDGE_OPTIONS& options);
 
-/// The Circolare 2019 (C8.7.2.2.3) reads shear at the displacement of the largest base reaction
-/// where that comes before the state.
+/// What is judged, in a step of the push.
+T_END_STATE StateOf(const T_JUDGED_END& end, const T_STEP_FORCES& step);
+
+/// The Circolare 2019 (C8.7.2.2.3) reads shear, and brittle demands on joints and columns, at the
+/// displacement of the largest base reaction where that comes before the state.
 bool ReadsShearAtPeak(const T_JUDGED_END& end);
 
 /// Fills rows and counts of a state that the path has at `index`.
 void JudgeState(const std::vector<T_JUDGED_END>& ends, const T_JUDGED_PATH& path, std::size_t index,
-                const T_JUDGE_FACTORS& factors, T_JUDGED_STATE& state);
+                const T_JUDGE_OPTIONS& options, T_JUDGED_STATE& state);
 
-/// By level and mode. Each state of the path is judged in turn; between the last one that keeps a
-/// limit and the first one that does not, the crossing is found by halving on the straight line
-/// between them, so that it is exact to 1e-9 of that piece. A limit that is passed and kept again
-/// between two neighbouring states is not seen.
+/// By level and mode, of the modes that some end has. Each state of the path is judged in turn;
+/// between the last one that keeps a limit and the first one that does not, the crossing is found
+/// by halving on the straight line between them, so that it is exact to 1e-9 of that piece. A limit
+/// that is passed and kept again between two neighbouring states is not seen.
 std::vector<T_FIRST_PASS> FirstPasses(const std::vector<T_JUDGED_END>& ends,
                                       const T_JUDGED_PATH& path, const T_JUDGE_FACTORS& factors);

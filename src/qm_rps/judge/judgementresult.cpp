@@ -3,32 +3,12 @@
 #include <algorithm>
 #include <limits>
 
-CODE_MARK LeastSureOf(const std::vector<T_CODE_TRACE>& trace)
+CODE_MARK LeastSureOf(const T_END_CHECKS& checks)
 {
     CODE_MARK least = CODE_MARK::Computed;
-    for (const T_CODE_TRACE& line : trace)
-        least = std::max(least, line.mark);
+    for (const T_MODE_CHECK& check : checks.modes)
+        least = std::max(least, check.leastSure);
     return least;
-}
-
-std::string ClauseOf(const T_JUDGED_END& end, const T_JUDGED_ROW& row, JUDGE_MODE mode,
-                     std::size_t level)
-{
-    if (end.basis != JUDGE_BASIS::Code || !row.checks.Of(mode, level)) return {};
-    const bool rotation = mode == JUDGE_MODE::Rotation;
-    const bool chord = IsChordCode(end.member.code);
-    const auto& trace = rotation ? row.checks.rotationTrace : row.checks.shearTrace;
-    const auto last = [&](std::string_view symbol) {
-        const auto at = std::find_if(trace.rbegin(), trace.rend(), [&](const T_CODE_TRACE& line) {
-            return line.symbol == symbol;
-        });
-        return at == trace.rend() ? std::string() : at->clause;
-    };
-    if (!rotation) {
-        if (chord) return last("Vw"); // (A.12) and what limits it
-        return last(end.column ? "V_Col" : "Vn");
-    }
-    return last(chord ? (level == 0 ? "theta_y" : "theta_um") : end.Levels()[level]);
 }
 
 CODE_MARK T_JUDGEMENT::LeastSure() const
@@ -36,8 +16,7 @@ CODE_MARK T_JUDGEMENT::LeastSure() const
     CODE_MARK least = CODE_MARK::Computed;
     for (const T_JUDGED_STATE& state : states)
         for (const T_JUDGED_ROW& row : state.rows)
-            least = std::max(
-                {least, LeastSureOf(row.checks.rotationTrace), LeastSureOf(row.checks.shearTrace)});
+            least = std::max(least, LeastSureOf(row.checks));
     return least;
 }
 

@@ -35,8 +35,5 @@ struct T_JUDGEMENT {
 /// The reached state whose worst ratio is the largest; null: none is reached.
 const T_JUDGED_STATE* WorstState(const T_JUDGEMENT& judgement);
 
-/// The least sure mark of a trace.
-CODE_MARK LeastSureOf(const std::vector<T_CODE_TRACE>& trace);
-/// Of the check of a row: the clause that its capacity at the level comes from.
-std::string ClauseOf(const T_JUDGED_END& end, const T_JUDGED_ROW& row, JUDGE_MODE mode,
-                     std::size_t level);
+/// The least sure mark of all figures of something.
+CODE_MARK LeastSureOf(const T_END_CHECKS& checks);

@@ -38,6 +38,7 @@ void PutRow(T_SHEET& sheet, std::size_t row, const T_JUDGEMENT& j, const T_JUDGE
     }
     PutRatio(sheet, row, C::Theta, C::ThetaCapacity, C::ThetaRatio);
     PutRatio(sheet, row, C::Shear, C::ShearCapacity, C::ShearRatio);
+    PutRatio(sheet, row, C::Other, C::OtherCapacity, C::OtherRatio);
 }
 
 void PutHeads(T_SHEET& sheet, const T_UNITS& units)

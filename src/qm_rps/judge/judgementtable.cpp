@@ -5,6 +5,7 @@
 #include "qm_rps/push/pushatpointtext.h"
 
 #include <algorithm>
+#include <map>
 #include <set>
 
 namespace {
@@ -36,6 +37,10 @@ constexpr std::array<T_COLUMN, kJudgedColumns> kColumns{{
     {C::Shear, "IDS_QM_JUDGE_SHEAR_DEMAND", "", kDimForce},
     {C::ShearCapacity, "", "VR", kDimForce},
     {C::ShearRatio, "IDS_QM_JUDGE_SHEAR_RATIO", "", {}},
+    {C::Other, "IDS_QM_JUDGE_OTHER", "", {}},
+    {C::OtherCapacity, "IDS_QM_JUDGE_CAPACITY", "", {}},
+    {C::OtherUnit, "IDS_QM_JUDGE_UNIT", "", {}},
+    {C::OtherRatio, "IDS_QM_JUDGE_THETA_RATIO", "", {}},
     {C::Governing, "IDS_QM_JUDGE_GOVERNING", "", {}},
     {C::Clause, "IDS_QM_JUDGE_CLAUSE", "", {}},
     {C::Verdict, "IDS_QM_JUDGE_VERDICT", "", {}},
@@ -62,25 +67,56 @@ private:
     T_UNITS m_units;
 };
 
-void PutCheck(const std::optional<T_CHECK>& check, C demand, C capacity, C ratio, CCells& to)
+/// The columns of a mode's demand, capacity and ratio.
+struct T_CHECK_COLUMNS {
+    C demand, capacity, ratio;
+};
+T_CHECK_COLUMNS ColumnsOf(JUDGE_MODE mode)
 {
-    if (!check) return;
-    to.Number(demand, check->demand);
-    to.Number(capacity, check->capacity);
-    to.Number(ratio, check->Ratio());
+    if (mode == JUDGE_MODE::Rotation) return {C::Theta, C::ThetaCapacity, C::ThetaRatio};
+    if (mode == JUDGE_MODE::Shear) return {C::Shear, C::ShearCapacity, C::ShearRatio};
+    return {C::Other, C::OtherCapacity, C::OtherRatio};
 }
 
-/// Why a check of the row is missing; both alike: once.
+void PutCheck(const T_MODE_CHECK& mode, std::size_t level, const T_UNITS& units, CCells& to)
+{
+    const std::optional<T_CHECK>& check = mode.at[level];
+    if (!check) return;
+    const T_CHECK_COLUMNS columns = ColumnsOf(mode.mode);
+    // Columns of other modes have no unit of their own.
+    const bool other = columns.demand == C::Other;
+    const auto shown = [&](double si) { return other ? FromSi(si, units, mode.dim) : si; };
+    to.Number(columns.demand, shown(check->demand));
+    to.Number(columns.capacity, shown(check->capacity));
+    to.Number(columns.ratio, check->Ratio());
+    if (other) to.Text(C::OtherUnit, UnitText(mode.dim, units));
+}
+
+/// Why a check is missing, by mode; those alike: once.
 std::string ReasonOf(const T_END_CHECKS& checks)
 {
     std::string text;
-    for (const JUDGE_MODE mode : {JUDGE_MODE::Rotation, JUDGE_MODE::Shear}) {
-        const std::string& why =
-            mode == JUDGE_MODE::Rotation ? checks.whyNoRotation : checks.whyNoShear;
-        if (why.empty() || (mode == JUDGE_MODE::Shear && why == checks.whyNoRotation)) continue;
-        text += (text.empty() ? "" : "; ") + ModeText(mode) + ": " + why;
+    std::vector<std::string> told;
+    for (const T_MODE_CHECK& check : checks.modes) {
+        if (check.why.empty() || std::ranges::find(told, check.why) != told.end()) continue;
+        told.push_back(check.why);
+        text += (text.empty() ? "" : "; ") + ModeText(check.mode) + ": " + check.why;
     }
     return text;
+}
+
+/// "3", "node 5"; "I"; "My", "X".
+struct T_PLACE_TEXT {
+    std::string what, end, axis;
+};
+T_PLACE_TEXT PlaceOf(const T_JUDGED_END& end)
+{
+    if (end.joint)
+        return {Say("IDS_QM_JUDGE_NODE", std::to_string(end.joint->node)), "",
+                kAxisNames[end.joint->along]};
+    return {std::to_string(end.place.element),
+            end.kind == JUDGED_KIND::Brace ? "" : (end.place.atJ ? "J" : "I"),
+            kComponentNames[static_cast<std::size_t>(end.place.component)]};
 }
 
 std::optional<double> Known(double value)
@@ -108,13 +144,27 @@ std::string VerdictCountText(const T_VERDICT_COUNT& count)
 
 std::string ModeText(JUDGE_MODE mode)
 {
-    return Say(mode == JUDGE_MODE::Rotation ? "IDS_QM_JUDGE_ROTATION" : "IDS_QM_JUDGE_SHEAR");
+    constexpr std::array<const char*, kModes> kKeys{"IDS_QM_JUDGE_ROTATION", "IDS_QM_JUDGE_SHEAR",
+                                                    "IDS_QM_JUDGE_AXIAL", "IDS_QM_JUDGE_ELONGATION",
+                                                    "IDS_QM_JUDGE_JOINT"};
+    return Say(kKeys[static_cast<std::size_t>(mode)]);
 }
 
 std::string EndText(const T_JUDGED_END& end)
 {
-    return std::to_string(end.place.element) + (end.place.atJ ? " J " : " I ") +
-           kComponentNames[static_cast<std::size_t>(end.place.component)];
+    const T_PLACE_TEXT place = PlaceOf(end);
+    return place.what + (place.end.empty() ? "" : " " + place.end) + " " + place.axis;
+}
+
+std::vector<std::string> UncheckedTexts(const T_JUDGED_STATE& state)
+{
+    std::map<std::string, std::size_t> count;
+    for (const T_JUDGED_ROW& row : state.rows)
+        if (const std::string reason = ReasonOf(row.checks); !reason.empty()) ++count[reason];
+    std::vector<std::string> texts;
+    for (const auto& [reason, rows] : count)
+        texts.push_back(std::to_string(rows) + ": " + reason);
+    return texts;
 }
 
 std::string StateText(const T_JUDGEMENT& judgement, const T_JUDGED_STATE& state)
@@ -142,9 +192,13 @@ T_JUDGED_CELLS CellsOf(const T_JUDGEMENT& judgement, const T_JUDGED_STATE& state
     const T_JUDGED_END& end = judgement.ends[row.end];
     CCells to(judgement.units);
     to.Text(C::State, StateText(judgement, state));
-    to.cells[static_cast<std::size_t>(C::Element)].number = end.place.element;
-    to.Text(C::End, end.place.atJ ? "J" : "I");
-    to.Text(C::Axis, kComponentNames[static_cast<std::size_t>(end.place.component)]);
+    const T_PLACE_TEXT place = PlaceOf(end);
+    if (end.joint)
+        to.Text(C::Element, place.what);
+    else
+        to.cells[static_cast<std::size_t>(C::Element)].number = end.place.element;
+    to.Text(C::End, place.end);
+    to.Text(C::Axis, place.axis);
     to.Text(C::Storey, end.storey);
     to.Text(C::Code, end.Code());
     to.Number(C::N, row.state.N);
@@ -152,17 +206,18 @@ T_JUDGED_CELLS CellsOf(const T_JUDGEMENT& judgement, const T_JUDGED_STATE& state
     to.Number(C::V, row.state.V);
     to.Number(C::Span, Known(row.checks.LV));
     to.Number(C::ThetaY, Known(row.checks.thetaY));
-    PutCheck(row.checks.rotation[state.level], C::Theta, C::ThetaCapacity, C::ThetaRatio, to);
-    PutCheck(row.checks.shear[state.level], C::Shear, C::ShearCapacity, C::ShearRatio, to);
-    const bool any = row.checks.rotation[state.level] || row.checks.shear[state.level];
+    bool any = false;
+    for (const T_MODE_CHECK& check : row.checks.modes) {
+        PutCheck(check, state.level, judgement.units, to);
+        any = any || check.at[state.level];
+    }
     if (any) {
         to.Text(C::Governing, ModeText(row.governing));
-        to.Text(C::Clause, ClauseOf(end, row, row.governing, state.level));
+        to.Text(C::Clause, row.checks.Of(row.governing)->clause[state.level]);
     }
     to.Text(C::Verdict, VerdictText(row.verdict));
     if (end.basis == JUDGE_BASIS::Code && any)
-        to.Text(C::Figures, MarkText(std::max(LeastSureOf(row.checks.rotationTrace),
-                                              LeastSureOf(row.checks.shearTrace))));
+        to.Text(C::Figures, MarkText(LeastSureOf(row.checks)));
     to.Text(C::Reason, ReasonOf(row.checks));
     return to.cells;
 }
@@ -187,9 +242,8 @@ std::vector<std::string> JudgementNotes(const T_JUDGEMENT& judgement)
         if (std::ranges::find(notes, note) == notes.end()) notes.push_back(note);
     };
     if (judgement.LeastSure() != CODE_MARK::Computed) add(Say("IDS_QM_JUDGE_UNSURE"));
-    add(Say("IDS_QM_JUDGE_JOINTS"));
     if (std::ranges::any_of(judgement.ends, [](const T_JUDGED_END& end) {
-            return end.basis == JUDGE_BASIS::Code && !IsChordCode(end.member.code) &&
+            return end.basis == JUDGE_BASIS::Code && !IsChordCode(end.By()) &&
                    !end.member.material.knowledge;
         }))
         add(Say("IDS_QM_JUDGE_NO_KNOWLEDGE"));

@@ -1,5 +1,5 @@
-// A judgement as one table: a row for every member end and limit state, the worst of a state first.
-// Terminal, sheet, window and report show its cells.
+// A judgement as one table: a row for every member end, brace, joint and limit state, the worst of
+// a state first. Terminal, sheet, window and report show its cells.
 #pragma once
 
 #include "qm_rps/judge/judgementresult.h"
@@ -23,13 +23,17 @@ enum class JUDGED_COLUMN {
     Shear,
     ShearCapacity,
     ShearRatio,
+    Other, // of the other modes
+    OtherCapacity,
+    OtherUnit,
+    OtherRatio,
     Governing,
     Clause,
     Verdict,
     Figures,
     Reason
 };
-inline constexpr std::size_t kJudgedColumns = 22;
+inline constexpr std::size_t kJudgedColumns = 26;
 
 /// A text, or a number in the units of the judgement.
 struct T_JUDGED_CELL {
@@ -52,11 +56,13 @@ std::string VerdictText(VERDICT verdict);
 std::string ModeText(JUDGE_MODE mode);
 /// "fulfilled 3, not fulfilled 1, not checked 0".
 std::string VerdictCountText(const T_VERDICT_COUNT& count);
-/// "3 J My".
+/// "3 J My", "3 Fx", "node 5 X".
 std::string EndText(const T_JUDGED_END& end);
 /// What must be known beside the table: what is not judged, how sure the figures are, warnings of
 /// the codes, each once.
 std::vector<std::string> JudgementNotes(const T_JUDGEMENT& judgement);
+/// Why things have no numbers at a state, how many for each reason.
+std::vector<std::string> UncheckedTexts(const T_JUDGED_STATE& state);
 /// "SD", where the ends' code has another name for it "SD (LS)".
 std::string StateText(const T_JUDGEMENT& judgement, const T_JUDGED_STATE& state);
 /// "SD (LS): demand", "LS, performance point".

@@ -18,6 +18,20 @@ std::size_t Letters(const std::string& text)
         text, [](char c) { return (static_cast<unsigned char>(c) & 0xC0U) != 0x80U; }));
 }
 
+/// Without the columns that have nothing but "-" below their heads, which are few things' own.
+T_LINES WithoutEmpty(const T_LINES& lines, std::size_t from, std::size_t to)
+{
+    T_LINES out(lines.size());
+    for (std::size_t c = 0; c < lines.front().size(); ++c) {
+        const bool isEmpty = std::all_of(lines.begin() + 1, lines.end(),
+                                         [&](const auto& line) { return line[c] == "-"; });
+        if (isEmpty && c >= from && c < to) continue;
+        for (std::size_t i = 0; i < lines.size(); ++i)
+            out[i].push_back(lines[i][c]);
+    }
+    return out;
+}
+
 /// Columns under their heads, to the right but for the last one.
 std::string Table(const T_LINES& lines)
 {
@@ -54,11 +68,27 @@ std::string CellText(const T_JUDGED_CELL& cell)
 
 using C = JUDGED_COLUMN;
 /// Columns of the terminal: what has a line of its own there is left out.
-constexpr std::array kShown{
-    C::Element,    C::End,    C::Axis,          C::N,          C::M,
-    C::V,          C::Span,   C::ThetaY,        C::Theta,      C::ThetaCapacity,
-    C::ThetaRatio, C::Shear,  C::ShearCapacity, C::ShearRatio, C::Governing,
-    C::Clause,     C::Verdict};
+constexpr std::array kShown{C::Element,
+                            C::End,
+                            C::Axis,
+                            C::N,
+                            C::M,
+                            C::V,
+                            C::Span,
+                            C::ThetaY,
+                            C::Theta,
+                            C::ThetaCapacity,
+                            C::ThetaRatio,
+                            C::Shear,
+                            C::ShearCapacity,
+                            C::ShearRatio,
+                            C::Other,
+                            C::OtherCapacity,
+                            C::OtherUnit,
+                            C::OtherRatio,
+                            C::Governing,
+                            C::Clause,
+                            C::Verdict};
 
 std::string RowLines(const T_JUDGEMENT& j, const T_JUDGED_STATE& state, std::size_t most)
 {
@@ -75,7 +105,9 @@ std::string RowLines(const T_JUDGEMENT& j, const T_JUDGED_STATE& state, std::siz
         const std::string& why = At(cells, C::Reason).text;
         if (!why.empty()) line.back() += " (" + why + ")";
     }
-    std::string text = Table(lines);
+    const auto first = std::ranges::find(kShown, C::Other) - kShown.begin();
+    const auto from = static_cast<std::size_t>(first);
+    std::string text = Table(WithoutEmpty(lines, from, from + 4));
     if (shown < state.rows.size())
         text +=
             "  " + Say("IDS_QM_JUDGE_MORE_ROWS", std::to_string(state.rows.size() - shown)) + '\n';
@@ -103,6 +135,8 @@ std::string StateLines(const T_JUDGEMENT& j, const T_JUDGED_STATE& state, std::s
             text += "  " + storey.storey + ": " + VerdictCountText(storey) + '\n';
     text += DriftLine(state);
     if (!state.shearAt.empty()) text += "  ! " + state.shearAt + '\n';
+    for (const std::string& reason : UncheckedTexts(state))
+        text += "  " + VerdictText(VERDICT::NotChecked) + " " + reason + '\n';
     return text + RowLines(j, state, most);
 }
 
@@ -121,7 +155,7 @@ std::vector<std::string> LimitCells(const T_JUDGEMENT& j, const T_JUDGED_LIMIT& 
     const std::string product = text(limit.factor && limit.demandPga,
                                      limit.factor.value_or(0.0) * limit.demandPga.value_or(0.0));
     std::string remark = limit.why;
-    if (limit.first.unchecked > 0 && limit.first.unchecked < j.ends.size())
+    if (limit.first.unchecked > 0 && limit.first.unchecked < limit.first.all)
         remark += (remark.empty() ? "" : "; ") +
                   Say("IDS_QM_JUDGE_UNCHECKED_ENDS", std::to_string(limit.first.unchecked));
     return {limit.state,
@@ -203,9 +237,12 @@ std::string JudgementTrace(const T_JUDGEMENT& j)
     std::string text;
     for (const T_JUDGED_STATE& state : j.states)
         for (const T_JUDGED_ROW& row : state.rows) {
-            if (row.checks.rotationTrace.empty() && row.checks.shearTrace.empty()) continue;
-            text += "\n  " + StateText(j, state) + ", " + EndText(j.ends[row.end]) + '\n' +
-                    TraceLines(j, row.checks.rotationTrace) + TraceLines(j, row.checks.shearTrace);
+            std::string lines;
+            for (const T_MODE_CHECK& check : row.checks.modes)
+                lines += TraceLines(j, check.trace);
+            if (!lines.empty())
+                text +=
+                    "\n  " + StateText(j, state) + ", " + EndText(j.ends[row.end]) + '\n' + lines;
         }
     return text;
 }

@@ -34,10 +34,19 @@ T_RATIO_BANDS RatioBands(const T_JUDGEMENT& judgement, const T_JUDGED_STATE& sta
                          const T_FRAME_SCENE& scene)
 {
     std::map<std::pair<int, bool>, std::size_t> bands;
+    std::map<int, std::size_t> joints;
+    const auto put = [](auto& to, const auto& key, std::size_t band) {
+        const auto [at, isNew] = to.try_emplace(key, band);
+        if (!isNew && IsWorse(band, at->second)) at->second = band;
+    };
     for (const T_JUDGED_ROW& row : state.rows) {
-        const T_END_PLACE& place = judgement.ends[row.end].place;
-        const auto [at, isNew] = bands.try_emplace({place.element, place.atJ}, BandOf(row));
-        if (!isNew && IsWorse(BandOf(row), at->second)) at->second = BandOf(row);
+        const T_JUDGED_END& end = judgement.ends[row.end];
+        const std::pair place(end.place.element, end.place.atJ);
+        if (end.joint)
+            put(joints, end.joint->node, BandOf(row));
+        else
+            put(bands, place, BandOf(row));
+        if (end.kind == JUDGED_KIND::Brace) put(bands, std::pair(place.first, true), BandOf(row));
     }
     T_RATIO_BANDS out;
     for (std::size_t i = 0; i < scene.lines.size(); ++i)
@@ -46,6 +55,11 @@ T_RATIO_BANDS RatioBands(const T_JUDGEMENT& judgement, const T_JUDGED_STATE& sta
                 out.halves.push_back({i, atJ, band->second});
                 ++out.count[band->second];
             }
+    for (std::size_t n = 0; n < scene.nodes.size(); ++n)
+        if (const auto band = joints.find(scene.nodes[n].id); band != joints.end()) {
+            out.nodes.push_back({n, band->second});
+            ++out.count[band->second];
+        }
     return out;
 }
 

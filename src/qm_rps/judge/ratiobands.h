@@ -1,4 +1,4 @@
-// Member ends on the picture of the frame, by their ratios at a limit state.
+// Member ends and joints on the picture of the frame, by their ratios at a limit state.
 #pragma once
 
 #include "qm_rps/desk/framescene.h"
@@ -16,9 +16,15 @@ struct T_BANDED_HALF {
     bool atJ = false;
     std::size_t band = kBandUnchecked; // the worse one of several axes
 };
+/// A joint, in the worse one of its planes.
+struct T_BANDED_NODE {
+    std::size_t node = 0; // of the scene
+    std::size_t band = kBandUnchecked;
+};
 struct T_RATIO_BANDS {
     std::vector<T_BANDED_HALF> halves;
-    std::array<std::size_t, kBands> count{}; // of halves
+    std::vector<T_BANDED_NODE> nodes;
+    std::array<std::size_t, kBands> count{}; // of halves and nodes
 };
 
 T_RATIO_BANDS RatioBands(const T_JUDGEMENT& judgement, const T_JUDGED_STATE& state,

@@ -125,7 +125,7 @@ void CFramePainter::DrawLines(QPainter& painter, const T_FRAME_SCENE& scene,
     }
 }
 
-/// Each half of a member in the colour of its end, the worst bands on top.
+/// Each half of a member in the colour of its end and each joint as a dot, the worst bands on top.
 void CFramePainter::DrawBands(QPainter& painter, const T_FRAME_PICTURE& picture) const
 {
     for (std::size_t step = 0; step < kBands; ++step) {
@@ -138,6 +138,15 @@ void CFramePainter::DrawBands(QPainter& painter, const T_FRAME_PICTURE& picture)
             painter.drawLine(half.atJ ? j : i, 0.5 * (i + j));
         }
     }
+    constexpr double kRadius = 4.5;
+    painter.setPen(QPen(Qt::white, 1.0));
+    for (std::size_t step = 0; step < kBands; ++step) {
+        const std::size_t band = step == 0 ? kBandUnchecked : step - 1;
+        painter.setBrush(BandPen(band).color());
+        for (const T_BANDED_NODE& node : picture.bands->nodes)
+            if (node.band == band) painter.drawEllipse(m_moved[node.node], kRadius, kRadius);
+    }
+    painter.setBrush(Qt::NoBrush);
 }
 
 /// A broad line below the one that is there.

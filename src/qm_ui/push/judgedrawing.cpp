@@ -13,7 +13,7 @@ T_FRAME_PICTURE JudgementPicture(const T_FRAME_SCENE& scene, const T_RATIO_BANDS
     picture.bands = &bands;
     picture.subtitle =
         Say("IDS_QM_JUDGE_PICTURE", judgement.evaluation, StateAtText(judgement, state));
-    picture.note = Say("IDS_QM_JUDGE_JOINTS");
+    picture.note = Say("IDS_QM_JUDGE_DOTS");
     return picture;
 }
 

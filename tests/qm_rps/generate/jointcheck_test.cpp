@@ -50,6 +50,12 @@ T_MODEL Frame()
     return m;
 }
 
+int Read(const T_MODEL& model, int node, std::size_t along, HINGE_CODE code, T_JOINT& joint,
+         std::string& reason)
+{
+    return ReadJoint(model, BeamsByNode(model)[node], node, along, code, joint, reason);
+}
+
 TEST(JointCheck, ByEachCode)
 {
     // Vj = 343.302 / (0.9 x 0.453) - 100 = 742.045; joint 0.40 x 0.40, N = 640.
@@ -72,7 +78,7 @@ TEST(JointCheck, ByEachCode)
         T_JOINT joint;
         T_JOINT_CHECK check;
         std::string reason;
-        ASSERT_EQ(1, ReadJoint(Frame(), 5, 0, c.code, joint, reason)) << reason;
+        ASSERT_EQ(1, Read(Frame(), 5, 0, c.code, joint, reason)) << reason;
         EXPECT_EQ(JOINT_KIND::Interior, joint.kind);
         EXPECT_EQ((std::vector<int>{12, 11}), joint.beams);
         ASSERT_EQ(1, CheckJoint(joint, demand, check, reason)) << reason;
@@ -95,15 +101,15 @@ TEST(JointCheck, KindsAndRefusals)
     T_JOINT joint;
     std::string reason;
     T_MODEL model = Frame();
-    ASSERT_EQ(1, ReadJoint(model, 8, 0, HINGE_CODE::Asce17, joint, reason));
+    ASSERT_EQ(1, Read(model, 8, 0, HINGE_CODE::Asce17, joint, reason));
     EXPECT_EQ(JOINT_KIND::Knee, joint.kind);
     model.elements.erase(11);
-    ASSERT_EQ(1, ReadJoint(model, 5, 0, HINGE_CODE::Asce17, joint, reason));
+    ASSERT_EQ(1, Read(model, 5, 0, HINGE_CODE::Asce17, joint, reason));
     EXPECT_EQ(JOINT_KIND::Exterior, joint.kind);
-    EXPECT_EQ(0, ReadJoint(model, 2, 0, HINGE_CODE::Asce17, joint, reason)); // a foot
-    EXPECT_EQ(0, ReadJoint(model, 5, 1, HINGE_CODE::Asce17, joint, reason)); // no beams along Y
+    EXPECT_EQ(0, Read(model, 2, 0, HINGE_CODE::Asce17, joint, reason)); // a foot
+    EXPECT_EQ(0, Read(model, 5, 1, HINGE_CODE::Asce17, joint, reason)); // no beams along Y
     model.sections.at(2).bars.clear();
-    EXPECT_EQ(0, ReadJoint(model, 5, 0, HINGE_CODE::Asce17, joint, reason));
+    EXPECT_EQ(0, Read(model, 5, 0, HINGE_CODE::Asce17, joint, reason));
     EXPECT_NE(std::string::npos, reason.find("bars"));
     T_JOINT_CHECK check;
     EXPECT_EQ(0, CheckJoint(joint, {std::nan(""), 0.0, 0.0}, check, reason));

@@ -1,0 +1,60 @@
+// Beam-column joints by their codes.
+#include "qm_base/say.h"
+#include "qm_rps/judge/judgedchecks.h"
+
+#include <cmath>
+
+namespace {
+
+constexpr auto R = CODE_MARK::Recalled;
+
+/// Joint shear with its sign: of the bars less that of the column above.
+double ShearOf(const T_JOINT& joint, const T_END_STATE& s)
+{
+    return s.M / joint.lever - s.V;
+}
+
+/// Brittle: the mean over the confidence factor over gamma_C, too.
+void Reduce(T_JOINT& joint, double gammaC)
+{
+    CCodeSheet sheet;
+    const char* const clause =
+        joint.code == HINGE_CODE::En1998 ? "EN 1998-3 2.2.1" : "Circolare 2019 C8.7.2.3.5";
+    joint.fc = sheet.Put("fc", joint.fc / gammaC, kDimStress, clause,
+                         "mean.fc/(CF " + CodeNumber(gammaC) + ")", R);
+    joint.trace.insert(joint.trace.end(), sheet.Trace().begin(), sheet.Trace().end());
+}
+
+} // namespace
+
+void CheckJointOf(const T_CHECKING& c)
+{
+    T_MODE_CHECK& check = c.Of(JUDGE_MODE::Joint);
+    const T_END_STATE& s = c.with.brittle;
+    T_JOINT joint = c.end.joint->joint;
+    const bool chord = IsChordCode(joint.code);
+    if (!chord && !c.with.gravity) {
+        check.why = Say("IDS_QM_JUDGE_NO_GRAVITY");
+        return;
+    }
+    if (chord) Reduce(joint, c.with.factors.gammaC);
+    T_JOINT_CHECK found;
+    if (CheckJoint(joint, {s.M, s.V, s.N}, found, check.why) == 0) return;
+    check.dim = found.dim;
+    check.trace = found.trace;
+    c.out.warnings = found.warnings;
+    check.clause.fill(ClauseOf(check.trace, {"Vj,R", "s_jt,max", "Vj"}));
+    if (chord) {
+        check.at.fill(T_CHECK{found.demand, found.capacity});
+        return;
+    }
+    CCodeSheet sheet;
+    const auto demands = ForceDemands("Vj", ShearOf(joint, s), ShearOf(joint, *c.with.gravity),
+                                      kDimForce, c.with.factors.gamma, sheet);
+    const double capacity =
+        sheet.Put("kappa QCL", KappaOf(c.end.member.material, sheet) * found.capacity, kDimForce,
+                  kForceClause, "kappa times the strength", R);
+    Keep(sheet, check, c.out);
+    for (std::size_t i = 0; i < kLevels; ++i)
+        check.at[i] = T_CHECK{std::fabs(demands[i]), capacity};
+}

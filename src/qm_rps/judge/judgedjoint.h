@@ -1,0 +1,25 @@
+// Beam-column joints in the steps of a push. SI.
+#pragma once
+
+#include "qm_rps/generate/jointcheck.h"
+#include "qm_rps/judge/endstate.h"
+
+/// A joint in the plane of the vertical and a horizontal axis.
+struct T_JUDGED_JOINT {
+    /// An end of a member at the node.
+    struct T_PART {
+        int element = 0;
+        bool atJ = false;
+        T_MEMBER_AXES axes;
+    };
+    int node = 0;
+    std::size_t along = 0;               // 0: X, 1: Y, 2: Z
+    std::array<double, 3> forth{}, up{}; // unit vectors, global
+    std::vector<T_PART> beams;
+    std::optional<T_PART> above; // column
+    T_JOINT joint;               // its code alone where it can't be judged
+};
+
+/// M: the beams' moments on the joint that push its top forth; V: the force of the column above on
+/// the joint, backwards; N: compression of the column above.
+T_END_STATE JointState(const T_JUDGED_JOINT& joint, const T_STEP_FORCES& step);

@@ -1,0 +1,244 @@
+// Members of steel: EN 1998-3 Annex B with EN 1993-1-1, Circolare 2019, ASCE 41 and FEMA 356 with
+// AISC 360.
+#include "qm_base/say.h"
+#include "qm_rps/codes/steelbuckling.h"
+#include "qm_rps/generate/rcend.h"
+#include "qm_rps/generate/steelhinge.h"
+#include "qm_rps/judge/judgedchecks.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace {
+
+constexpr auto K = CODE_MARK::Computed;
+constexpr auto R = CODE_MARK::Recalled;
+using enum JUDGE_MODE;
+
+bool FillWhy(T_MODE_CHECK& check, const CCodeSheet& sheet)
+{
+    check.why = ReasonOf(sheet);
+    return false;
+}
+
+// ---- shear --------------------------------------------------------------------------------------
+
+/// The shear strength that hinges are generated with, which no axial force changes; ASCE 41: with
+/// the lower-bound yield strength, which is that entered.
+std::optional<double> ShearStrength(const T_JUDGED_END& end, CCodeSheet& sheet, std::string& why)
+{
+    T_MEMBER_END member = end.member;
+    member.kind = MEMBER_KIND::Beam;
+    T_MATL_D& m = member.material;
+    const bool chord = IsChordCode(member.code);
+    if (!chord && m.Fy > 0.0) {
+        m.mean = m.mean.value_or(T_MATL_MEAN{});
+        m.mean->fy = m.Fy;
+    }
+    const auto side = GeneratedSide(member, true, why);
+    if (!side) return {};
+    const char* const clause = chord           ? "EN 1993-1-1 6.2.6"
+                               : member.aboutY ? "AISC 360 G2.1"
+                                               : "AISC 360 G6";
+    return sheet.Put("Vn", side->shearStrength, kDimForce, clause,
+                     chord           ? "Av fy/sqrt(3), fy over CF"
+                     : member.aboutY ? "0.6 Fy Aw Cv1, lower bound"
+                                     : "0.6 Fy 2 bf tf, lower bound",
+                     R);
+}
+
+bool CheckShear(const T_CHECKING& c)
+{
+    T_MODE_CHECK& check = c.Of(Shear);
+    CCodeSheet sheet;
+    const auto strength = ShearStrength(c.end, sheet, check.why);
+    if (!strength) return false;
+    const double V = c.with.brittle.V;
+    if (IsChordCode(c.end.By())) {
+        const double ratio = std::fabs(V) / *strength;
+        if (ratio > 0.5 && ratio <= 1.0)
+            sheet.Warn("IDS_QM_GEN_WARN_HALF_SHEAR", {CodeNumber(ratio)});
+        check.at.fill(T_CHECK{std::fabs(V), *strength});
+    } else {
+        if (!c.with.gravity) {
+            check.why = Say("IDS_QM_JUDGE_NO_GRAVITY");
+            return false;
+        }
+        const auto demands =
+            ForceDemands("Q", V, c.with.gravity->V, kDimForce, c.with.factors.gamma, sheet);
+        const double capacity =
+            sheet.Put("kappa QCL", KappaOf(c.end.member.material, sheet) * *strength, kDimForce,
+                      kForceClause, "kappa times the strength", R);
+        for (std::size_t i = 0; i < kLevels; ++i)
+            check.at[i] = T_CHECK{std::fabs(demands[i]), capacity};
+    }
+    Keep(sheet, check, c.out);
+    check.clause.fill(ClauseOf(check.trace, {"Vn"}));
+    return true;
+}
+
+// ---- axial force of columns ---------------------------------------------------------------------
+
+/// The column under the axial force of a state, whose strengths are `fy`.
+T_BUCKLING BucklingOf(const T_STEEL_BASIS& in, double fy)
+{
+    return {in.shape.A, in.end.clear, in.Least(), fy, in.E};
+}
+
+/// Moments about y and z of a state of the end.
+T_STEEL_FORCES ForcesOf(const T_MEMBER_END& member, double N, double M, double across)
+{
+    return member.aboutY ? T_STEEL_FORCES{N, M, across} : T_STEEL_FORCES{N, across, M};
+}
+
+/// Compression against buckling; with the moments where the code counts on no rotation.
+bool EnAxial(const T_CHECKING& c, const T_STEEL_BASIS& in, bool withMoments, CCodeSheet& sheet)
+{
+    T_MODE_CHECK& check = c.Of(Axial);
+    const T_END_STATE& s = c.with.brittle;
+    const auto buckled =
+        EnBuckling(BucklingOf(in, in.fy), EnImperfection(in.shape, in.iz <= in.iy, sheet), sheet);
+    if (!buckled) return FillWhy(check, sheet);
+    const double pressed = std::max(0.0, s.N);
+    check.clause.fill("EN 1993-1-1 6.3.1");
+    if (!withMoments) {
+        check.at.fill(T_CHECK{pressed, *buckled});
+        return true;
+    }
+    const double alone = sheet.Put("N/Nb", pressed / *buckled, "EN 1993-1-1 6.3.1", "", K);
+    const auto both =
+        EnAxialBending(in.shape, in.strength, ForcesOf(in.end, s.N, s.M, s.across), sheet);
+    if (!both) return FillWhy(check, sheet);
+    if (both->ratio >= alone) check.clause.fill("EN 1993-1-1 6.2.9.1");
+    check.dim = kDimNone;
+    check.at.fill(T_CHECK{std::max(both->ratio, alone), 1.0});
+    return true;
+}
+
+bool AsceAxial(const T_CHECKING& c, const T_STEEL_BASIS& in, bool withMoments, CCodeSheet& sheet)
+{
+    T_MODE_CHECK& check = c.Of(Axial);
+    const T_END_STATE &s = c.with.brittle, &g = *c.with.gravity;
+    const double gamma = c.with.factors.gamma, kappa = KappaOf(in.end.material, sheet);
+    const auto buckled = AiscBuckling(BucklingOf(in, in.lower), sheet);
+    if (!buckled) return FillWhy(check, sheet);
+    const double PCL = sheet.Put("kappa P_CL", kappa * *buckled, kDimForce, kForceClause,
+                                 "kappa times Pn with the lower-bound Fy", R);
+    const auto N = ForceDemands("P", s.N, g.N, kDimForce, gamma, sheet);
+    check.clause.fill(withMoments ? "AISC 360 H1.1" : "AISC 360 E3");
+    if (!withMoments) {
+        for (std::size_t i = 0; i < kLevels; ++i)
+            check.at[i] = T_CHECK{std::max(0.0, N[i]), PCL};
+        return true;
+    }
+    const T_SECT_D& section = in.end.section;
+    const auto M = ForceDemands("M", s.M, g.M, kDimMoment, gamma, sheet);
+    const auto across = ForceDemands("M across ", s.across, g.across, kDimMoment, gamma, sheet);
+    check.dim = kDimNone;
+    for (std::size_t i = 0; i < kLevels; ++i) {
+        const double pulled = kappa * in.shape.A * in.lower;
+        const T_STEEL_PLASTIC_STRENGTH available{N[i] > 0.0 ? PCL : pulled,
+                                                 kappa * section.Zy * in.lower,
+                                                 kappa * section.Zz * in.lower};
+        const auto ratio =
+            AiscInteraction(available, ForcesOf(in.end, N[i], M[i], across[i]), sheet);
+        if (!ratio) {
+            check.at.fill(std::nullopt);
+            return FillWhy(check, sheet);
+        }
+        check.at[i] = T_CHECK{*ratio, 1.0};
+    }
+    return true;
+}
+
+/// withMoments: no rotation may be counted on.
+bool CheckAxial(const T_CHECKING& c, bool withMoments)
+{
+    T_MODE_CHECK& check = c.Of(Axial);
+    const bool chord = IsChordCode(c.end.By());
+    if (!chord && !c.with.gravity) {
+        check.why = Say("IDS_QM_JUDGE_NO_GRAVITY");
+        return false;
+    }
+    CCodeSheet sheet;
+    T_MEMBER_END member = c.end.member;
+    member.axial = c.with.brittle.N;
+    const std::optional<T_STEEL_BASIS> in = SteelBasis(member, sheet);
+    if (!in) return FillWhy(check, sheet);
+    sheet.Put("N", in->axial, kDimForce, "", "compression positive", K);
+    sheet.Put("K L", member.clear, kDimLength, "", "clear length, K = 1", K);
+    if (!(chord ? EnAxial(c, *in, withMoments, sheet) : AsceAxial(c, *in, withMoments, sheet)))
+        return false;
+    Keep(sheet, check, c.out);
+    return true;
+}
+
+/// The code counts on no rotation under this axial force: P_G/Pye above 0.6, P/P_CL above 0.5
+/// (ASCE 41); N/Npl above 0.30 (EN 1998-3 Annex B).
+bool CountsOnNoRotation(const T_CHECKING& c)
+{
+    if (!c.end.member.HasAxial()) return false;
+    if (!IsChordCode(c.end.By())) return c.Of(Rotation).why == Say("IDS_QM_GEN_FORCE");
+    constexpr double kMost = 0.30;
+    CCodeSheet sheet;
+    const std::optional<T_STEEL_BASIS> in = SteelBasis(c.end.member, sheet);
+    return in && std::max(0.0, c.state.N) > kMost * in->strength.Npl;
+}
+
+void CheckRotation(const T_CHECKING& c)
+{
+    if (IsChordCode(c.end.By())) return GeneratedChord(c);
+    const bool ofGravity = c.end.By() == HINGE_CODE::Asce17 && c.end.member.HasAxial();
+    if (ofGravity && !c.with.gravity) {
+        c.Of(Rotation).why = Say("IDS_QM_JUDGE_NO_GRAVITY");
+        return;
+    }
+    PlasticRotations(c, ofGravity ? c.with.gravity->N : c.state.N);
+}
+
+} // namespace
+
+void CheckSteel(const T_CHECKING& c)
+{
+    CheckRotation(c);
+    (void)CheckShear(c);
+    if (!c.out.Of(Axial)) return;
+    const bool withMoments = CountsOnNoRotation(c);
+    if (CheckAxial(c, withMoments) && withMoments)
+        std::erase_if(c.out.modes, [](const T_MODE_CHECK& m) { return m.mode == Rotation; });
+}
+
+void CheckBrace(const T_CHECKING& c)
+{
+    T_MODE_CHECK& check = c.Of(Elongation);
+    const bool chord = IsChordCode(c.end.By());
+    const T_END_STATE& s = c.state;
+    const double elastic = c.end.spring > 0.0 ? s.hingeMoment / c.end.spring : 0.0;
+    const double deformed = chord ? s.chord : s.flowed - elastic;
+    T_SIDES<T_CODE_SIDE> sides;
+    if (SteelBrace(c.end.member, sides, check.why) == 0) return;
+    const bool tension = deformed == 0.0 ? s.N <= 0.0 : deformed > 0.0;
+    const T_CODE_SIDE& side = tension ? sides.pos : sides.neg;
+    if (!side.bone.acceptance) {
+        check.why = Say("IDS_QM_GEN_NO_ANSWER");
+        return;
+    }
+    check.trace = side.trace;
+    c.out.warnings = side.warnings;
+    CCodeSheet sheet;
+    const double demand =
+        sheet.Put(chord ? "Delta" : "Delta_pl", std::fabs(deformed), kDimLength, "",
+                  chord ? "elongation of the member" : "of the hinge beyond yield", K);
+    const double kappa = chord ? 1.0 : KappaOf(c.end.member.material, sheet);
+    for (std::size_t i = 0; i < kLevels; ++i) {
+        const double limit = (*side.bone.acceptance)[i];
+        const double capacity = chord
+                                    ? limit
+                                    : sheet.Put(std::string("kappa ") + kLevelNames[0][i],
+                                                kappa * side.bone.Plastic(limit), kDimLength,
+                                                "ASCE 41-17 7.5.3.2.1", "kappa times the table", R);
+        check.at[i] = T_CHECK{demand, capacity};
+        check.clause[i] = ClauseOf(check.trace, {kLevelNames[chord ? 1 : 0][i]});
+    }
+    Keep(sheet, check, c.out);
+}
