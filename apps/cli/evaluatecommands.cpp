@@ -6,6 +6,7 @@
 #include "qm_base/say.h"
 #include "qm_db/recordfacts.h"
 #include "qm_rps/evaluatedsteps.h"
+#include "qm_rps/judgedevaluation.h"
 #include "qm_rps/push/pushatpointtext.h"
 #include "qm_rps/push/pushended.h"
 #include "qm_rps/pushover/evaluation/pushovercomparison.h"
@@ -163,13 +164,17 @@ EXIT_CODE WritePlots(const std::string& path, const std::vector<T_PUSH_EVALUATIO
 }
 
 /// Reports of several evaluations follow one another in one file.
-EXIT_CODE WriteReports(const std::string& path, const std::vector<T_PUSH_EVALUATION>& results,
+EXIT_CODE WriteReports(CDBDoc& doc, const T_EVALUATE_OPTIONS& o,
+                       const std::vector<T_PUSH_EVALUATION>& results,
                        const std::vector<T_HINGES_AT>& hinges)
 {
+    T_JUDGE_OPTIONS options;
+    options.code = HingeCodeNamed(o.code);
     std::string text;
     for (std::size_t i = 0; i < results.size(); ++i)
-        text += PushoverReportText(results[i]) + HingesAtReport(hinges[i]);
-    return WriteOutput(path, text);
+        text += PushoverReportText(results[i]) + HingesAtReport(hinges[i]) +
+                ReportOfJudgement(doc, results[i], options, ProgressOnTerminal(doc));
+    return WriteOutput(o.report, text);
 }
 
 EXIT_CODE WriteCurves(const std::string& path, const std::vector<T_PUSH_EVALUATION>& results)
@@ -189,13 +194,14 @@ void StoreSteps(CDBDoc& doc)
         Complain(EXIT_CODE::Done, Say("IDS_QM_CLI_STEPS_NOT_STORED", error.text));
 }
 
-EXIT_CODE WriteResults(const T_EVALUATE_OPTIONS& o, const std::vector<T_PUSH_EVALUATION>& results,
+EXIT_CODE WriteResults(CDBDoc& doc, const T_EVALUATE_OPTIONS& o,
+                       const std::vector<T_PUSH_EVALUATION>& results,
                        const std::vector<T_HINGES_AT>& hinges)
 {
     EXIT_CODE code = EXIT_CODE::Done;
     const auto ok = [&] { return code == EXIT_CODE::Done; };
     if (!o.json.empty()) code = WriteOutput(o.json, ResultJson(results, hinges));
-    if (ok() && !o.report.empty()) code = WriteReports(o.report, results, hinges);
+    if (ok() && !o.report.empty()) code = WriteReports(doc, o, results, hinges);
     if (ok() && !o.curve.empty()) code = WriteCurves(o.curve, results);
     if (ok() && !o.plot.empty()) code = WritePlots(o.plot, results, false);
     if (ok() && !o.plotDemand.empty()) code = WritePlots(o.plotDemand, results, true);
@@ -266,7 +272,7 @@ EXIT_CODE RunEvaluate(const T_EVALUATE_OPTIONS& o)
     if (const EXIT_CODE code = EvaluateAll(doc, o, results, extras); code != EXIT_CODE::Done)
         return code;
     const std::vector<T_HINGES_AT> hinges = HingesAtPoints(doc, results);
-    if (const EXIT_CODE code = WriteResults(o, results, hinges); code != EXIT_CODE::Done)
+    if (const EXIT_CODE code = WriteResults(doc, o, results, hinges); code != EXIT_CODE::Done)
         return code;
     if (o.json != "-") PrintTables(results, hinges);
     if (o.trace && o.json != "-") {

@@ -1,5 +1,6 @@
 // The arguments of the commands on pushover evaluations.
 #include "evaluatecommands.h"
+#include "qm_rps/generate/codeside.h"
 #include "registershared.h"
 #include "registrations.h"
 #include "verifycommand.h"
@@ -14,7 +15,11 @@ void AddEvaluate(CLI::App& app, EXIT_CODE& code)
     sub->add_option("--only", o->only, Say("IDS_QM_HELP_EVALUATE_ONLY"));
     sub->add_option("--push", o->push, Say("IDS_QM_HELP_EVALUATE_PUSH"));
     AddJson(sub, o->json);
-    sub->add_option("--report", o->report, Say("IDS_QM_HELP_EVALUATE_REPORT"));
+    auto* const report = sub->add_option("--report", o->report, Say("IDS_QM_HELP_EVALUATE_REPORT"));
+    sub->add_option("--code", o->code, Say("IDS_QM_HELP_EVALUATE_CODE"))
+        ->check(
+            CLI::IsMember(std::vector<std::string>(kHingeCodeNames.begin(), kHingeCodeNames.end())))
+        ->needs(report);
     sub->add_option("--curve", o->curve, Say("IDS_QM_HELP_EVALUATE_CURVE"));
     sub->add_option("--plot", o->plot, Say("IDS_QM_HELP_EVALUATE_PLOT"));
     sub->add_option("--plot-demand", o->plotDemand, Say("IDS_QM_HELP_EVALUATE_DEMAND"));

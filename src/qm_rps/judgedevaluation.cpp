@@ -2,6 +2,7 @@
 
 #include "qm_base/say.h"
 #include "qm_db/recordfacts.h"
+#include "qm_rps/judge/judgementtext.h"
 #include "qm_rps/judge/spectrumfactor.h"
 #include "qm_rps/pushovercalculators.h"
 
@@ -207,4 +208,16 @@ T_JUDGEMENT JudgeEvaluation(CDBDoc& doc, const T_PUSH_EVALUATION& result,
                 JudgeState(out.ends, path, *index, options, state);
     FindLimits(doc, result, path, run.startDisplacement, out);
     return out;
+}
+
+std::string ReportOfJudgement(CDBDoc& doc, const T_PUSH_EVALUATION& result,
+                              const T_JUDGE_OPTIONS& options, const PUSH_PROGRESS_FN& progress)
+{
+    const T_MODEL& model = doc.Data().Model();
+    const bool hasHinges = std::ranges::any_of(model.hinges, [&](const auto& entry) {
+        const auto type = model.hingeTypes.find(entry.second.hingeType);
+        return type != model.hingeTypes.end() && type->second.generated;
+    });
+    if (!options.code && !hasHinges) return {};
+    return JudgementReport(JudgeEvaluation(doc, result, options, progress));
 }

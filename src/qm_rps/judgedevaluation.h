@@ -13,3 +13,8 @@
 /// LS, CP where the code has these), the performance point by all three.
 T_JUDGEMENT JudgeEvaluation(CDBDoc& doc, const T_PUSH_EVALUATION& result,
                             const T_JUDGE_OPTIONS& options, const PUSH_PROGRESS_FN& progress);
+
+/// The judgement as the report of an evaluation has it; empty where no code is named and the model
+/// has no hinges that a code gave.
+std::string ReportOfJudgement(CDBDoc& doc, const T_PUSH_EVALUATION& result,
+                              const T_JUDGE_OPTIONS& options, const PUSH_PROGRESS_FN& progress);

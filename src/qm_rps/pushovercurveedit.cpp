@@ -277,11 +277,13 @@ void CPushOverCurveEdit::OnPushoverCurveTextout()
 {
     const T_PUSH_EVALUATION& result = m_shown.Result();
     std::vector<T_HINGES_AT> hinges;
+    std::string judgement;
     Pushing([&](const PUSH_PROGRESS_FN& progress) {
         hinges = HingesOfEvaluations(m_doc, {&result, 1}, progress);
+        judgement = ReportOfJudgement(m_doc, result, {}, progress);
     });
     ShowText("IDS_QM_UI_PUSH_REPORT_TITLE",
-             PushoverReportText(result) + HingesAtReport(hinges.front()));
+             PushoverReportText(result) + HingesAtReport(hinges.front()) + judgement);
 }
 
 void CPushOverCurveEdit::Pushing(const PUSHING_FN& pushing) const

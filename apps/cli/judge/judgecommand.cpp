@@ -27,9 +27,7 @@ constexpr std::size_t kRowsOnTerminal = 20; // of each limit state
 T_JUDGE_OPTIONS OptionsOf(const T_JUDGE_COMMAND& o)
 {
     T_JUDGE_OPTIONS options;
-    const auto code = std::ranges::find(kHingeCodeNames, o.code);
-    if (code != kHingeCodeNames.end())
-        options.code = static_cast<HINGE_CODE>(code - kHingeCodeNames.begin());
+    options.code = HingeCodeNamed(o.code);
     options.secondary = o.members == "secondary";
     for (const T_LEVELS& names : kLevelNames)
         for (std::size_t i = 0; i < kLevels; ++i)

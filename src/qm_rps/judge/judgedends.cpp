@@ -9,13 +9,6 @@
 
 namespace {
 
-std::optional<HINGE_CODE> CodeNamed(const std::string& name)
-{
-    const auto at = std::ranges::find(kHingeCodeNames, name);
-    if (at == kHingeCodeNames.end()) return {};
-    return static_cast<HINGE_CODE>(at - kHingeCodeNames.begin());
-}
-
 /// The lowest storey that does not end below a height; empty: none.
 std::string StoreyAt(const T_PUSH_RUN& run, double top)
 {
@@ -67,7 +60,7 @@ private:
 std::optional<HINGE_CODE> CLookup::CodeOf(int element) const
 {
     const T_PHGT_D* const type = GeneratedType(element);
-    return type ? CodeNamed(type->generated->code) : std::nullopt;
+    return type ? HingeCodeNamed(type->generated->code) : std::nullopt;
 }
 
 void PutHinge(const CLookup& lookup, const char* place, T_JUDGED_END& end)
@@ -112,7 +105,7 @@ public:
         bool secondary = m_options.secondary;
         const T_PHGT_D* const type = m_lookup.GeneratedType(id);
         if (!code && type) {
-            code = CodeNamed(type->generated->code);
+            code = HingeCodeNamed(type->generated->code);
             secondary = type->generated->secondary;
             m_tie = type->generated->tie;
         }
@@ -315,6 +308,13 @@ private:
 };
 
 } // namespace
+
+std::optional<HINGE_CODE> HingeCodeNamed(const std::string& name)
+{
+    const auto at = std::ranges::find(kHingeCodeNames, name);
+    if (at == kHingeCodeNames.end()) return {};
+    return static_cast<HINGE_CODE>(at - kHingeCodeNames.begin());
+}
 
 std::vector<T_JUDGED_END> JudgedEnds(const T_MODEL& model, const T_PUSH_RUN& run,
                                      const T_JUDGE_OPTIONS& options)

@@ -58,6 +58,9 @@ struct T_JUDGE_OPTIONS {
     bool operator==(const T_JUDGE_OPTIONS&) const = default;
 };
 
+/// "EN1998-3"; empty: there is no such code.
+std::optional<HINGE_CODE> HingeCodeNamed(const std::string& name);
+
 /// The ends of the beam elements: about the axes that a code or their hinges bend them, else one
 /// row that says why there is nothing to judge; braces; then the joints of columns with beams by
 /// their nodes, in each plane that has beams. `run`: its hinges and storeys.

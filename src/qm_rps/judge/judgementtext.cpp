@@ -90,13 +90,20 @@ constexpr std::array kShown{C::Element,
                             C::Clause,
                             C::Verdict};
 
-std::string RowLines(const T_JUDGEMENT& j, const T_JUDGED_STATE& state, std::size_t most)
+/// How many rows of a state are shown (0: all), and what is said of the others.
+struct T_SHOWN_ROWS {
+    std::size_t most = 0;
+    const char* more = "IDS_QM_JUDGE_MORE_ROWS";
+};
+
+std::string RowLines(const T_JUDGEMENT& j, const T_JUDGED_STATE& state, const T_SHOWN_ROWS& rows)
 {
     const auto heads = JudgedHeads(j.units);
     T_LINES lines(1);
     for (const C column : kShown)
         lines.front().push_back(heads[static_cast<std::size_t>(column)]);
-    const std::size_t shown = most == 0 ? state.rows.size() : std::min(most, state.rows.size());
+    const std::size_t shown =
+        rows.most == 0 ? state.rows.size() : std::min(rows.most, state.rows.size());
     for (std::size_t i = 0; i < shown; ++i) {
         const T_JUDGED_CELLS cells = CellsOf(j, state, state.rows[i]);
         std::vector<std::string>& line = lines.emplace_back();
@@ -109,8 +116,7 @@ std::string RowLines(const T_JUDGEMENT& j, const T_JUDGED_STATE& state, std::siz
     const auto from = static_cast<std::size_t>(first);
     std::string text = Table(WithoutEmpty(lines, from, from + 4));
     if (shown < state.rows.size())
-        text +=
-            "  " + Say("IDS_QM_JUDGE_MORE_ROWS", std::to_string(state.rows.size() - shown)) + '\n';
+        text += "  " + Say(rows.more, std::to_string(state.rows.size() - shown)) + '\n';
     return text;
 }
 
@@ -122,7 +128,7 @@ std::string DriftLine(const T_JUDGED_STATE& state)
     return text.empty() ? text : "  " + Say("IDS_QM_JUDGE_DRIFTS", text) + '\n';
 }
 
-std::string StateLines(const T_JUDGEMENT& j, const T_JUDGED_STATE& state, std::size_t most)
+std::string StateLines(const T_JUDGEMENT& j, const T_JUDGED_STATE& state, const T_SHOWN_ROWS& rows)
 {
     const std::string at = Number(FromSi(state.point.displacement, j.units, kDimLength)) + " " +
                            std::string(NameOf(j.units.length));
@@ -137,7 +143,7 @@ std::string StateLines(const T_JUDGEMENT& j, const T_JUDGED_STATE& state, std::s
     if (!state.shearAt.empty()) text += "  ! " + state.shearAt + '\n';
     for (const std::string& reason : UncheckedTexts(state))
         text += "  " + VerdictText(VERDICT::NotChecked) + " " + reason + '\n';
-    return text + RowLines(j, state, most);
+    return text + RowLines(j, state, rows);
 }
 
 /// "0.123 m at 3 J My", or why not.
@@ -198,9 +204,7 @@ std::string TraceLines(const T_JUDGEMENT& j, const std::vector<T_CODE_TRACE>& tr
     return text;
 }
 
-} // namespace
-
-std::string JudgementText(const T_JUDGEMENT& j, std::size_t mostRows)
+std::string Whole(const T_JUDGEMENT& j, const T_SHOWN_ROWS& rows)
 {
     std::string text =
         "\n[ " +
@@ -209,11 +213,24 @@ std::string JudgementText(const T_JUDGEMENT& j, std::size_t mostRows)
         " ]\n";
     if (!j.note.empty()) return text + "  " + j.note + '\n';
     for (const T_JUDGED_STATE& state : j.states)
-        text += StateLines(j, state, mostRows);
+        text += StateLines(j, state, rows);
     text += LimitLines(j) + '\n';
     for (const std::string& line : JudgementNotes(j))
         text += "! " + line + '\n';
     return text;
+}
+
+} // namespace
+
+std::string JudgementText(const T_JUDGEMENT& j, std::size_t mostRows)
+{
+    return Whole(j, {mostRows});
+}
+
+std::string JudgementReport(const T_JUDGEMENT& j)
+{
+    constexpr std::size_t kWorst = 10;
+    return Whole(j, {kWorst, "IDS_QM_JUDGE_MORE_REPORT"});
 }
 
 std::string JudgedLimitsText(const T_JUDGEMENT& j)

@@ -6,6 +6,8 @@
 /// Counts, first passes and the rows of every limit state. mostRows: of each state, the worst; 0:
 /// all.
 std::string JudgementText(const T_JUDGEMENT& judgement, std::size_t mostRows);
+/// The same with the ten worst rows of each limit state, as a part of a report.
+std::string JudgementReport(const T_JUDGEMENT& judgement);
 /// A sentence for each limit state and mode: where along the push the first end is beyond it, and
 /// at what ground acceleration.
 std::string JudgedLimitsText(const T_JUDGEMENT& judgement);
