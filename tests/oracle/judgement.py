@@ -2,8 +2,11 @@
 """Demand and capacity of a cantilever column, independent of the program: python3 judgement.py
 
 0.40 x 0.40, 8 bars of 18 mm, stirrups 8 mm at 0.15, clear length and shear span 3 m, N = 640 kN;
-strengths 28 and 450 MPa, characteristic ones 20 and 400. Formulas as they are printed (EN 1998-3
-Annex A; Panagiotakos, Fardis 2001; ASCE 41-17 Eq. (10-3), Table 10-8). kN, m, MPa.
+strengths 28 and 450 MPa, characteristic ones 20 and 400. The joint of that column with one beam
+0.30 x 0.50 (bars at 0.453 m from the compressed edge); the same cantilever as a welded I 200x200x9x15 of
+fy 275, mean 303 MPa. Formulas as they are printed (EN 1998-3
+Annex A; Panagiotakos, Fardis 2001; ASCE 41-17 Eq. (10-3), Table 10-8; EN 1998-1 5.5.3.3; Circolare 2019
+[C8.7.2.11]; ASCE 41-17 Table 10-12; EN 1998-3 Annex B; EN 1993-1-1 6.2.6, 6.2.9, 6.3.1; AISC 360 E3, G2). kN, m, MPa.
 """
 import math
 
@@ -56,5 +59,37 @@ def asce17():
     print("ASCE41-17", dict(expected=shear(fc, fy), lower=shear(fcl, fyl)))
 
 
+def joint(cf, gamma_c):
+    """Exterior joint without hoops: bj = 0.40, hc = 0.40, N = 640."""
+    fc, area = 28.0 / cf / gamma_c, 0.16
+    eta, nu = 0.6 * (1 - fc / 250), N / 1000 / (area * fc)
+    psi = 0.006894757293168
+    print("joint", dict(lever=0.9 * 0.453, en=0.8 * eta * fc * math.sqrt(1 - nu / eta) * area * 1000,
+                        circolare_tension=0.3 * math.sqrt(fc) * 1000, circolare_compression=0.5 * fc * 1000,
+                        asce_kappa=0.9 * 6 * math.sqrt(20.0 / psi) * psi * area * 1000))
+
+
+def steel(n, cf):
+    """Cantilever of 3 m under n kN, bent about y; buckling over 3 m about z."""
+    h, b, tw, tf, e, fy, fyl = 0.2, 0.2, 0.009, 0.015, 210000.0, 303.0 / cf, 275.0
+    hw = h - 2 * tf
+    a, w = 2 * b * tf + hw * tw, b * tf * (h - tf) + tw * hw ** 2 / 4
+    iy, iz = (b * h ** 3 - (b - tw) * hw ** 3) / 12, (2 * tf * b ** 3 + hw * tw ** 3) / 12
+    npl, share = a * fy * 1000, min(0.5, (a - 2 * b * tf) / a)
+    my = w * fy * 1000 * min(1.0, (1 - n / npl) / (1 - 0.5 * share))
+    theta = my * 3 / (3 * e * 1000 * iy)
+    slender = 3 / math.sqrt(iz / a) / (math.pi * math.sqrt(e / fy))
+    phi = 0.5 * (1 + 0.49 * (slender - 0.2) + slender ** 2)  # curve c
+    buckled = npl / (phi + math.sqrt(phi ** 2 - slender ** 2))
+    fe = math.pi ** 2 * e / (3 ** 2 / (iz / a))
+    pn = a * 0.658 ** (fyl / fe) * fyl * 1000
+    print("steel", n, dict(nu=n / npl, my=my, theta_y=theta, DL=2 * theta, SD=7 * theta, NC=9 * theta,
+                           shear=hw * tw * fy / math.sqrt(3) * 1000, buckled=buckled,
+                           asce_shear_kappa=0.9 * 0.6 * fyl * h * tw * 1000, asce_pn_kappa=0.9 * pn))
+
+
 en1998(1.20, 1.5, 1.15)
 asce17()
+joint(1.20, 1.5)
+steel(400.0, 1.20)
+steel(640.0, 1.20)
