@@ -8,16 +8,6 @@
 
 namespace {
 
-T_STATE_CONTEXT ContextOf(const T_JUDGED_PATH& path, std::size_t end, const T_END_STATE& brittle,
-                          const T_JUDGE_FACTORS& factors)
-{
-    T_STATE_CONTEXT with;
-    with.brittle = brittle;
-    if (path.hasStart) with.gravity = path.ends.front()[end];
-    with.factors = factors;
-    return with;
-}
-
 /// Checks that govern first: no capacity, then the larger ratio.
 bool Governs(const T_CHECK& a, const T_CHECK& b)
 {
@@ -61,44 +51,17 @@ std::vector<T_JUDGED_ROW> Sorted(std::vector<T_JUDGED_ROW> rows)
     return rows;
 }
 
-/// The check of one end between two states of the path.
-struct T_PIECE {
-    const T_JUDGED_END& end;
-    const T_JUDGED_PATH& path;
-    std::size_t index = 0, from = 0; // of the end; state before
-    std::size_t peak = 0;            // state of the largest base reaction
-    const T_JUDGE_FACTORS& factors;
-
-    /// The checks at a share of the way to the next state.
-    T_END_CHECKS At(double share) const
-    {
-        const T_END_STATE& a = path.ends[from][index];
-        const T_END_STATE s = share == 0.0 ? a : Between(a, path.ends[from + 1][index], share);
-        const bool before = from < peak || (from == peak && share == 0.0);
-        const T_END_STATE& shear = ReadsShearAtPeak(end) && !before ? path.ends[peak][index] : s;
-        return CheckEnd(end, s, ContextOf(path, index, shear, factors));
-    }
-};
-
-bool Passes(const T_END_CHECKS& checks, JUDGE_MODE mode, std::size_t level)
-{
-    const T_MODE_CHECK* const check = checks.Of(mode);
-    return check && check->at[level] && !check->at[level]->Holds();
-}
-
-/// Share of the piece at which the end passes the limit; it does at its end.
-double ShareOf(const T_PIECE& piece, JUDGE_MODE mode, std::size_t level)
-{
-    constexpr double kClose = 1e-9;
-    double keeps = 0.0, passes = 1.0;
-    while (passes - keeps > kClose) {
-        const double middle = 0.5 * (keeps + passes);
-        (Passes(piece.At(middle), mode, level) ? passes : keeps) = middle;
-    }
-    return passes;
-}
-
 } // namespace
+
+T_STATE_CONTEXT ContextOf(const T_JUDGED_PATH& path, std::size_t end, const T_END_STATE& brittle,
+                          const T_JUDGE_FACTORS& factors)
+{
+    T_STATE_CONTEXT with;
+    with.brittle = brittle;
+    if (path.hasStart) with.gravity = path.ends.front()[end];
+    with.factors = factors;
+    return with;
+}
 
 bool ReadsShearAtPeak(const T_JUDGED_END& end)
 {
@@ -130,48 +93,4 @@ void JudgeState(const std::vector<T_JUDGED_END>& ends, const T_JUDGED_PATH& path
     state.rows = Sorted(std::move(state.rows));
     if (shearIndex < index && std::ranges::any_of(ends, ReadsShearAtPeak))
         state.shearAt = Say("IDS_QM_JUDGE_AT_PEAK");
-}
-
-std::vector<T_FIRST_PASS> FirstPasses(const std::vector<T_JUDGED_END>& ends,
-                                      const T_JUDGED_PATH& path, const T_JUDGE_FACTORS& factors)
-{
-    std::array<std::size_t, kModes> having{};
-    for (const T_JUDGED_END& end : ends)
-        for (const JUDGE_MODE mode : ModesOf(end))
-            ++having[static_cast<std::size_t>(mode)];
-    std::vector<T_FIRST_PASS> out;
-    for (std::size_t level = 0; level < kLevels; ++level)
-        for (std::size_t mode = 0; mode < kModes; ++mode)
-            if (having[mode] > 0)
-                out.push_back(
-                    {level, static_cast<JUDGE_MODE>(mode), {}, false, 0.0, 0.0, 0, having[mode]});
-    const std::size_t peak = LargestShearAt(path);
-    for (std::size_t i = 0; i < path.displacement.size(); ++i) {
-        std::vector<double> share(out.size(), 2.0); // of the piece before the state; 2: none
-        for (std::size_t e = 0; e < ends.size(); ++e) {
-            const T_END_CHECKS now = T_PIECE{ends[e], path, e, i, peak, factors}.At(0.0);
-            for (std::size_t k = 0; k < out.size(); ++k) {
-                T_FIRST_PASS& first = out[k];
-                const T_MODE_CHECK* const check = now.Of(first.mode);
-                if (i == 0 && check && !check->at[first.level]) ++first.unchecked;
-                if ((first.end && share[k] > 1.0) || !Passes(now, first.mode, first.level))
-                    continue;
-                const T_PIECE piece{ends[e], path, e, i == 0 ? 0 : i - 1, peak, factors};
-                const double at = i == 0 ? 0.0 : ShareOf(piece, first.mode, first.level);
-                if (at >= share[k]) continue;
-                share[k] = at;
-                first.end = e;
-                first.atStart = i == 0;
-                const std::size_t from = piece.from, to = i;
-                const auto between = [&](const std::vector<double>& v) {
-                    return v[from] + at * (v[to] - v[from]);
-                };
-                first.displacement = between(path.displacement);
-                first.baseReaction = between(path.baseReaction);
-            }
-        }
-        if (std::ranges::all_of(out, [](const T_FIRST_PASS& f) { return f.end.has_value(); }))
-            break;
-    }
-    return out;
 }

@@ -74,13 +74,20 @@ T_END_STATE StateOf(const T_JUDGED_END& end, const T_STEP_FORCES& step);
 /// displacement of the largest base reaction where that comes before the state.
 bool ReadsShearAtPeak(const T_JUDGED_END& end);
 
+/// What an end is judged with in a state of the path; `brittle`: where brittle demands are read.
+T_STATE_CONTEXT ContextOf(const T_JUDGED_PATH& path, std::size_t end, const T_END_STATE& brittle,
+                          const T_JUDGE_FACTORS& factors);
+
 /// Fills rows and counts of a state that the path has at `index`.
 void JudgeState(const std::vector<T_JUDGED_END>& ends, const T_JUDGED_PATH& path, std::size_t index,
                 const T_JUDGE_OPTIONS& options, T_JUDGED_STATE& state);
 
-/// By level and mode, of the modes that some end has. Each state of the path is judged in turn;
-/// between the last one that keeps a limit and the first one that does not, the crossing is found
-/// by halving on the straight line between them, so that it is exact to 1e-9 of that piece. A limit
-/// that is passed and kept again between two neighbouring states is not seen.
+/// By level and mode, of the modes that some end has. Between the last state of the path that keeps
+/// a limit and the first one that does not, the crossing is found by halving on the straight line
+/// between them, so that it is exact to 1e-9 of that piece. A limit that is passed and kept again
+/// between two neighbouring states is not seen.
+/// States of the path are left out where they can't matter: behind what has been passed first
+/// already, and between two judged ones whose forces and deformations bound those of all states
+/// between and whose ratios leave twice their difference (at least 0.02) up to 1.
 std::vector<T_FIRST_PASS> FirstPasses(const std::vector<T_JUDGED_END>& ends,
                                       const T_JUDGED_PATH& path, const T_JUDGE_FACTORS& factors);
