@@ -12,6 +12,10 @@
 #include <QPushButton>
 #include <QSignalBlocker>
 
+#include <array>
+#include <charconv>
+#include <cmath>
+
 namespace {
 
 using zql::lib::MMSGFunction;
@@ -19,6 +23,18 @@ using zql::lib::MMSGFunction;
 QString Fault(const char* key)
 {
     return QString::fromStdString(MMSGFunction::GetValue(key));
+}
+
+/// All digits, and no exponent where a person would not write one.
+QString NumberText(double value)
+{
+    constexpr double kLeast = 1e-4, kMost = 1e9;
+    const double size = std::fabs(value);
+    if (!(size >= kLeast && size < kMost)) return LocalNumberText(ShortestText(value));
+    std::array<char, 32> buffer; // at most 17 digits, a sign, a point and 4 zeros before them
+    const auto end = std::to_chars(buffer.data(), buffer.data() + buffer.size(), value,
+                                   std::chars_format::fixed);
+    return LocalNumberText({buffer.data(), end.ptr});
 }
 
 class CTextField : public CFormField {
@@ -195,8 +211,8 @@ std::unique_ptr<CFormField> MakeNumberField(T_BINDING<double> b, ChangedFn chang
         return number ? QString() : Fault("IDS_QM_UI_NOT_A_NUMBER");
     };
     if (!b.set) read = nullptr;
-    return MakeTextField([get = b.get] { return LocalNumberText(ShortestText(get())); },
-                         std::move(read), std::move(changed), parent);
+    return MakeTextField([get = b.get] { return NumberText(get()); }, std::move(read),
+                         std::move(changed), parent);
 }
 
 std::unique_ptr<CFormField> MakeOptionalField(T_BINDING<std::optional<double>> b, ChangedFn changed,
@@ -212,7 +228,7 @@ std::unique_ptr<CFormField> MakeOptionalField(T_BINDING<std::optional<double>> b
     return MakeTextField(
         [get = b.get] {
             const std::optional<double> value = get();
-            return value ? LocalNumberText(ShortestText(*value)) : QString();
+            return value ? NumberText(*value) : QString();
         },
         std::move(read), std::move(changed), parent);
 }

@@ -235,7 +235,8 @@ ChangedFn CFormView::Changed(bool edits)
 
 bool CFormView::IsTouched() const
 {
-    return m_touched || std::ranges::any_of(findChildren<QLineEdit*>(), &QLineEdit::isModified);
+    const bool changed = m_isChanged ? m_isChanged() : m_touched;
+    return changed || std::ranges::any_of(findChildren<QLineEdit*>(), &QLineEdit::isModified);
 }
 
 CFormField& CFormView::Number(TextFn caption, T_BINDING<double> binding, TextFn unit)
@@ -296,6 +297,7 @@ CFormField& CFormView::Picture(std::function<T_PLOT()> plot)
 
 CFormField& CFormView::Grid(T_GRID_BINDING binding)
 {
+    TellWhenTaken(binding, [this] { m_touched = true; });
     auto* view = new CGridView(std::move(binding), Changed(), this);
     view->m_refuse = [this](const char* key) {
         if (m_message) m_message(key);

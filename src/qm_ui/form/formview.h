@@ -64,6 +64,8 @@ public:
     void SetFindings(std::function<std::vector<T_FINDING>()> findings);
     /// Called after each change by the person, before the fields are read again.
     std::function<void()> m_onChange;
+    /// Whether the model has changes that are not stored; empty: whether the person has edited.
+    std::function<bool()> m_isChanged;
     /// Shows a message (key) of the form itself.
     std::function<void(const char* key)> m_message;
 
@@ -73,7 +75,7 @@ public:
     bool Commit();
     /// Focus to the first marked field, on its page.
     void ShowFirstMark();
-    /// The person has changed a field, or is typing in one.
+    /// The person has changed a field or a table, or is typing in one.
     bool IsTouched() const;
     /// Number of marked fields.
     int Marks() const;

@@ -52,3 +52,17 @@ T_GRID_BINDING GridOf(std::function<T_TEXT_TABLE()> make)
     };
     return b;
 }
+
+void TellWhenTaken(T_GRID_BINDING& grid, const std::function<void()>& tell)
+{
+    const auto add = [&tell](auto& take) {
+        if (!take) return;
+        take = [before = take, tell](auto&&... given) {
+            const int done = before(given...);
+            if (done) tell();
+            return done;
+        };
+    };
+    add(grid.set);
+    add(grid.paste);
+}

@@ -42,3 +42,5 @@ T_GRID_BINDING GridOf(CRecordGrid& grid);
 T_GRID_BINDING GridOf(CNumberGrid& grid);
 /// A table that is only read, made again with each refresh; its number of columns stays.
 T_GRID_BINDING GridOf(std::function<T_TEXT_TABLE()> make);
+/// Calls back after each cell or block that was taken.
+void TellWhenTaken(T_GRID_BINDING& grid, const std::function<void()>& tell);
