@@ -6,12 +6,8 @@
 
 #include <algorithm>
 
-CCodeHingeDlg::CCodeHingeDlg(CDBDoc& doc) : m_doc(doc), m_scene(doc), m_types(doc)
+CCodeHingeDlg::CCodeHingeDlg(CDBDoc& doc) : m_options(doc), m_doc(doc), m_scene(doc), m_types(doc)
 {
-    const auto& concrete = doc.Data().Model().styp.designCodes.concrete;
-    const bool eurocode = concrete && concrete->starts_with("Eurocode");
-    m_request.options.code = eurocode ? HINGE_CODE::En1998 : HINGE_CODE::Asce17;
-    m_request.keepGoing = true;
     m_status = Say("IDS_QM_UI_GEN_CHOOSE");
 }
 
@@ -61,18 +57,8 @@ void CCodeHingeDlg::OnStale()
 {
     const std::vector<int> stale = m_types.StaleElements();
     m_elements = {stale.begin(), stale.end()};
+    m_options.TakeStale(stale);
     Forget();
-    const T_MODEL& model = m_doc.Data().Model();
-    for (const auto& entry : model.hinges) {
-        if (!m_elements.contains(entry.second.element)) continue;
-        const auto type = model.hingeTypes.find(entry.second.hingeType);
-        if (type == model.hingeTypes.end() || !type->second.generated) continue;
-        const auto code = std::ranges::find(kHingeCodeNames, type->second.generated->code);
-        if (code == kHingeCodeNames.end()) continue;
-        m_request.options.code = static_cast<HINGE_CODE>(code - kHingeCodeNames.begin());
-        m_request.options.secondary = type->second.generated->secondary;
-        break;
-    }
 }
 
 std::string CCodeHingeDlg::ElementsText() const
@@ -105,24 +91,6 @@ std::vector<std::string> CCodeHingeDlg::CodeTexts()
     return {kHingeCodeNames.begin(), kHingeCodeNames.end()};
 }
 
-void CCodeHingeDlg::OnCode(HINGE_CODE code)
-{
-    m_request.options.code = code;
-    Forget();
-}
-
-void CCodeHingeDlg::OnSecondary(bool secondary)
-{
-    m_request.options.secondary = secondary;
-    Forget();
-}
-
-void CCodeHingeDlg::OnKeepGoing(bool keepGoing)
-{
-    m_request.keepGoing = keepGoing;
-    Forget();
-}
-
 // ---- what they would get ------------------------------------------------------------------------
 
 /// A preview of another choice is none.
@@ -147,10 +115,11 @@ void CCodeHingeDlg::Take(T_CODE_HINGES hinges)
 int CCodeHingeDlg::OnPreview()
 {
     if (m_elements.empty()) return 0;
-    m_request.elements = {m_elements.begin(), m_elements.end()};
+    T_CODE_REQUEST request;
     T_CODE_HINGES hinges;
     T_HINGE_REFUSAL refusal;
-    if (!CCodeHinges(m_doc).Preview(m_request, hinges, refusal)) {
+    if (!m_options.Read({m_elements.begin(), m_elements.end()}, request, refusal.text) ||
+        !m_options.Preview(request, hinges, refusal)) {
         Forget();
         m_status = refusal.text;
         return 0;
@@ -193,7 +162,7 @@ std::vector<T_CODE_ROW_OF_HINGE> CCodeHingeDlg::Rows() const
 bool CCodeHingeDlg::IsChord() const
 {
     const auto rows = Rows();
-    return rows.empty() ? IsChordCode(m_request.options.code)
+    return rows.empty() ? IsChordCode(m_options.m_code)
                         : rows.front().of->bone.levels == CODE_LEVELS::DlSdNc;
 }
 
@@ -265,7 +234,8 @@ T_TEXT_TABLE CCodeHingeDlg::Trace() const
 
 std::string CCodeHingeDlg::WarningsText() const
 {
-    std::string text;
+    std::string text = CodeIterationsText(m_hinges, m_options.Units());
+    if (!text.empty()) text.pop_back(); // the last end of a line
     const auto add = [&text](const std::string& line) {
         text += (text.empty() ? "" : "\n") + line;
     };
@@ -293,10 +263,12 @@ int CCodeHingeDlg::OnApply()
         ShowMessage("IDS_QM_UI_GEN_CHOOSE");
         return 0;
     }
-    m_request.elements = {m_elements.begin(), m_elements.end()};
+    T_CODE_REQUEST request;
     T_CODE_HINGES hinges;
     T_HINGE_REFUSAL refusal;
-    if (!CCodeHinges(m_doc).Generate(m_request, hinges, refusal)) return Refuse(refusal);
+    if (!m_options.Read({m_elements.begin(), m_elements.end()}, request, refusal.text) ||
+        !m_options.Generate(request, hinges, refusal))
+        return Refuse(refusal);
     Take(std::move(hinges));
     m_status = Say("IDS_QM_GEN_DONE", std::to_string(m_hinges.elements.size()),
                    std::to_string(m_hinges.types));

@@ -3,6 +3,7 @@
 #pragma once
 
 #include "qm_base/mdialog.h"
+#include "qm_rps/desk/codehingeoptions.h"
 #include "qm_rps/desk/framescene.h"
 #include "qm_rps/dialog/texttable.h"
 #include "qm_rps/generate/codehingerows.h"
@@ -12,8 +13,7 @@
 
 class CCodeHingeDlg : public zql::frx::MDialog {
 public:
-    /// The document must outlive the dialog. No member is chosen; the code is EN 1998-3 in a model
-    /// of Eurocodes, else ASCE 41-17.
+    /// The document must outlive the dialog. No member is chosen.
     explicit CCodeHingeDlg(CDBDoc& doc);
 
     // ---- members ----
@@ -26,7 +26,7 @@ public:
     void OnLines(const std::vector<std::size_t>& lines);
     void OnAll(); // beams, and trusses of steel: other elements have no such hinges
     void OnNone();
-    /// Members of types that are out of date, and their code.
+    /// Members of types that are out of date, and what these were asked for.
     void OnStale();
     std::string ElementsText() const; // "1, 4-9"
     /// 0 with a message: no such list, or an element that the model does not have.
@@ -34,16 +34,13 @@ public:
 
     // ---- code ----
     static std::vector<std::string> CodeTexts();
-    HINGE_CODE Code() const { return m_request.options.code; }
-    void OnCode(HINGE_CODE code);
-    bool IsSecondary() const { return m_request.options.secondary; }
-    void OnSecondary(bool secondary);
-    /// Members that can't have a hinge are left out and named, else nothing is done.
-    bool KeepsGoing() const { return m_request.keepGoing; }
-    void OnKeepGoing(bool keepGoing);
+    CCodeHingeOptions m_options;
+    /// After each change of the options.
+    void OnOptions() { Forget(); }
 
     // ---- what they would get ----
-    /// Works the hinges out; the document stays as it is. 0: StatusText says why not.
+    /// Works the hinges out, with the pushes that they need; the document stays as it is. 0:
+    /// StatusText says why not.
     int OnPreview();
     bool HasPreview() const { return !m_firsts.empty(); }
     /// A row for each type: section, member, elements.
@@ -64,7 +61,8 @@ public:
     const T_SHOWN* Shown() const { return m_shown ? &*m_shown : nullptr; }
     /// Every number of the chosen side: symbol, value, unit, formula, clause, mark.
     T_TEXT_TABLE Trace() const;
-    /// Warnings of the chosen type and of the model, members that are left out; a line each.
+    /// The pushes, warnings of the chosen type and of the model, members that are left out; a line
+    /// each.
     std::string WarningsText() const;
     std::string StatusText() const { return m_status; }
 
@@ -86,7 +84,6 @@ private:
     CDBDoc& m_doc;
     CFrameScene m_scene;
     CGeneratedTypes m_types;
-    T_CODE_REQUEST m_request;
     std::set<int> m_elements;
     T_CODE_HINGES m_hinges;
     std::vector<const T_CODE_ELEMENT*> m_firsts; // of the types

@@ -180,3 +180,104 @@ TEST_F(CodeHingeWindows, StaleTypesAreMarkedAndMadeAgain)
         EXPECT_EQ("", types.Fault(key));
     EXPECT_EQ((std::vector<int>{11, 12}), HingedElements());
 }
+
+TEST_F(CodeHingeWindows, APushGivesTheShearAndStaleTypesKeepIt)
+{
+    CDBDoc& doc = m_main->Doc();
+    const long before = doc.Data().Revision();
+    std::vector<double> pushed;
+    Show([&](CDialogWindow& w) {
+        auto* const shear = qobject_cast<QComboBox*>(Field(w, "shear"));
+        ASSERT_NE(nullptr, shear);
+        ASSERT_EQ(1 + std::ssize(Model().pushovers), shear->count());
+        Push(w, "IDS_QM_UI_GEN_ALL");
+        Push(w, "IDS_QM_UI_GEN_PREVIEW");
+        const QString ratio = Cell(Grid(w, "sides").Model(), 0, 5);
+        EXPECT_FALSE(Says(w, "push 1:"));
+        ChooseIndex(shear, 1);
+        Push(w, "IDS_QM_UI_GEN_PREVIEW");
+        EXPECT_TRUE(Says(w, "push 1:"));
+        EXPECT_NE(ratio, Cell(Grid(w, "sides").Model(), 0, 5));
+        EXPECT_EQ(before, doc.Data().Revision());
+        EXPECT_EQ(&doc, CDBDoc::GetDocPoint());
+        const QString previewed = Cell(Grid(w, "sides").Model(), 0, 5);
+        Push(w, "IDS_QM_UI_GEN_APPLY");
+        EXPECT_TRUE(Says(w, "push 1:"));
+        EXPECT_EQ(previewed, Cell(Grid(w, "sides").Model(), 0, 5));
+        Cancel(w);
+    });
+    for (const auto& [key, type] : Model().hingeTypes)
+        EXPECT_FALSE(type.generated->pushed.empty()) << type.name;
+    const auto of = [&](int element) -> const T_GENERATED& {
+        for (const auto& [key, hinge] : Model().hinges)
+            if (hinge.element == element) return *Model().hingeTypes.at(hinge.hingeType).generated;
+        throw std::out_of_range("no hinge");
+    };
+    pushed = of(11).pushed;
+    T_SECT_D beam;
+    ASSERT_TRUE(doc.Attr().GetSect(2, beam));
+    beam.detailing->stirrupSpacing = 0.1;
+    {
+        CEditScope edit(doc, "Closer stirrups");
+        ASSERT_TRUE(edit.Put(2, beam) && edit.Commit());
+    }
+    Show([&](CDialogWindow& w) {
+        Push(w, "IDS_QM_UI_GEN_STALE_BTN");
+        EXPECT_EQ("11-14", TextAt(w, "elements"));
+        auto* const shear = qobject_cast<QComboBox*>(Field(w, "shear"));
+        EXPECT_EQ(shear->count() - 1, shear->currentIndex());
+        EXPECT_TRUE(shear->currentText().contains("stale"));
+        Push(w, "IDS_QM_UI_GEN_APPLY");
+        Cancel(w);
+    });
+    EXPECT_EQ(pushed, of(11).pushed);
+    for (int i = 0; i < 3; ++i)
+        Run("IDS_QM_UI_UNDO");
+    EXPECT_TRUE(Model().hinges.empty());
+    EXPECT_TRUE(Model().hingeTypes.empty());
+}
+
+TEST_F(CodeHingeWindows, AxialForcesAreThoseOfTheUnitsAndOfTheStaleTypes)
+{
+    CDBDoc& doc = m_main->Doc();
+    Show([](CDialogWindow& w) {
+        EXPECT_TRUE(Field(w, "axialFrom")->isHidden()); // of chord rotations there are none
+        EXPECT_TRUE(Field(w, "tie")->isHidden());       // no masonry
+        ChooseIndex(Field(w, "code"), static_cast<int>(HINGE_CODE::Asce17));
+        Enter(w, "elements", "1, 2");
+        Enter(w, "axialFrom", "300");
+        Enter(w, "axialTo", "100");
+        Push(w, "IDS_QM_UI_GEN_PREVIEW");
+        EXPECT_TRUE(Says(w, "300..100: expected two forces"));
+        Enter(w, "axialTo", "");
+        Push(w, "IDS_QM_UI_GEN_PREVIEW");
+        EXPECT_TRUE(Says(w, "300..?: expected two forces"));
+        Enter(w, "axialFrom", "100");
+        Enter(w, "axialTo", "300");
+        Push(w, "IDS_QM_UI_GEN_APPLY");
+        Cancel(w);
+    });
+    ASSERT_FALSE(Model().hingeTypes.empty());
+    for (const auto& [key, type] : Model().hingeTypes)
+        EXPECT_EQ((std::vector<double>{1e5, 3e5}), type.generated->axialRange);
+    T_SECT_D column;
+    ASSERT_TRUE(doc.Attr().GetSect(1, column));
+    column.detailing->stirrupSpacing = 0.1;
+    T_STYP_D styp = Model().styp;
+    styp.units = {FORCE_UNIT::N, LENGTH_UNIT::mm};
+    {
+        CEditScope edit(doc, "Closer stirrups, other units");
+        ASSERT_TRUE(edit.Put(1, column) && edit.PutStyp(styp) && edit.Commit());
+    }
+    Show([](CDialogWindow& w) {
+        Push(w, "IDS_QM_UI_GEN_STALE_BTN");
+        EXPECT_EQ("100000", TextAt(w, "axialFrom"));
+        EXPECT_EQ("300000", TextAt(w, "axialTo"));
+        EXPECT_EQ(static_cast<int>(HINGE_CODE::Asce17),
+                  qobject_cast<QComboBox*>(Field(w, "code"))->currentIndex());
+        Push(w, "IDS_QM_UI_GEN_APPLY");
+        Cancel(w);
+    });
+    for (const auto& [key, type] : Model().hingeTypes)
+        EXPECT_EQ((std::vector<double>{1e5, 3e5}), type.generated->axialRange);
+}

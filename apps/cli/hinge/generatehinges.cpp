@@ -5,6 +5,7 @@
 #include "output.h"
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/desk/codehingeoptions.h"
 #include "qm_rps/desk/elementlist.h"
 #include "qm_rps/generate/codehingerows.h"
 
@@ -117,20 +118,6 @@ EXIT_CODE ReadRequest(const T_HINGE_GENERATE_OPTIONS& o, CDBDoc& doc, T_CODE_REQ
     return EXIT_CODE::Done;
 }
 
-/// "push 1: V of element 4 by 31.2 % (74.6 -> 108.4), target reached".
-std::string IterationsText(const T_CODE_HINGES& hinges, const T_UNITS& units)
-{
-    std::string text;
-    int number = 0;
-    for (const T_CODE_ITERATION& it : hinges.iterations)
-        text += Say("IDS_QM_GEN_ITERATION", std::to_string(++number),
-                    std::to_string(it.change.element), FormatText("%.3g", 100.0 * it.change.change),
-                    Number(FromSi(it.change.before, units, kDimForce)) + " -> " +
-                        Number(FromSi(it.change.now, units, kDimForce))) +
-                ", " + it.outcome + "\n";
-    return text;
-}
-
 EXIT_CODE CheckOptions(const T_HINGE_GENERATE_OPTIONS& o, T_CODE_REQUEST& request)
 {
     if (o.stale) {
@@ -175,7 +162,7 @@ EXIT_CODE RunHingeGenerate(const T_HINGE_GENERATE_OPTIONS& o)
         return Complain(EXIT_CODE::BadInput, o.file + ": " + refusal.text);
     const T_UNITS units = doc.Unit().Units();
     if (o.json != "-") {
-        const std::string text = IterationsText(hinges, units) + Table(hinges, false, units) +
+        const std::string text = CodeIterationsText(hinges, units) + Table(hinges, false, units) +
                                  Table(hinges, true, units) +
                                  (o.trace ? TraceText(hinges, units) : "") + WarningsText(hinges);
         std::fputs(text.c_str(), stdout);

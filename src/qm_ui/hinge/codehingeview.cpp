@@ -1,5 +1,6 @@
-#include "qm_base/msgfunction.h"
+#include "qm_base/say.h"
 #include "qm_rps/codehingedlg.h"
+#include "qm_rps/dialog/unithead.h"
 #include "qm_ui/frame/frameview.h"
 #include "qm_ui/hinge/hingeplot.h"
 #include "qm_ui/hinge/hingeviews.h"
@@ -79,25 +80,66 @@ void AddTable(CFormView& form, T_GRID_BINDING grid, const char* name, QSize leas
     field.widget->setMaximumHeight(most);
 }
 
-void AddMembers(CFormView& form, DLG& d)
+/// A member of the options.
+template <class T>
+T_BINDING<T> Option(DLG& d, T& value)
 {
+    return {[&value] { return value; },
+            [&d, &value](const T& v) {
+                value = v;
+                d.OnOptions();
+            }};
+}
+
+template <class E>
+T_BINDING<int> OptionIndex(DLG& d, E& value)
+{
+    return {[&value] { return static_cast<int>(value); },
+            [&d, &value](const int& index) {
+                value = static_cast<E>(index);
+                d.OnOptions();
+            }};
+}
+
+void AddOptions(CFormView& form, DLG& d)
+{
+    CCodeHingeOptions& o = d.m_options;
+    const auto head = [&o](const char* key) {
+        return [&o, key] { return HeadWithUnit(Say(key), kDimForce, o.Units()); };
+    };
     form.Columns();
-    form.Choice(KeyText("IDS_QM_UI_GEN_CODE"),
-                {[&d] { return static_cast<int>(d.Code()); },
-                 [&d](const int& i) { d.OnCode(static_cast<HINGE_CODE>(i)); }},
+    form.Choice(KeyText("IDS_QM_UI_GEN_CODE"), OptionIndex(d, o.m_code),
                 [] { return DLG::CodeTexts(); })
         .name = "code";
     form.NextColumn();
-    form.Choice(KeyText("IDS_QM_UI_GEN_LEVEL"),
-                {[&d] { return d.IsSecondary() ? 1 : 0; },
-                 [&d](const int& i) { d.OnSecondary(i == 1); }},
+    form.Choice(KeyText("IDS_QM_UI_GEN_LEVEL"), OptionIndex(d, o.m_secondary),
                 KeyTexts({"IDS_QM_UI_GEN_PRIMARY", "IDS_QM_UI_GEN_SECONDARY_MEMBER"}))
         .name = "level";
     form.EndColumns();
+    form.Choice(KeyText("IDS_QM_UI_GEN_SHEAR"), Option(d, o.m_shear),
+                [&o] { return o.ShearTexts(); })
+        .name = "shear";
+    form.Columns();
+    CFormField& from = form.Optional(head("IDS_QM_UI_GEN_AXIAL_FROM"), Option(d, o.m_axial[0]));
+    from.name = "axialFrom";
+    form.NextColumn();
+    CFormField& to = form.Optional(KeyText("IDS_QM_UI_GEN_AXIAL_TO"), Option(d, o.m_axial[1]));
+    to.name = "axialTo";
+    form.EndColumns();
+    for (CFormField* field : {&from, &to})
+        field->shown = [&o] { return o.HasAxialCurves(); };
+    CFormField& tie = form.Number(head("IDS_QM_UI_GEN_TIE"), Option(d, o.m_tie));
+    tie.name = "tie";
+    tie.shown = [&o] { return o.HasMasonry(); };
+}
+
+void AddMembers(CFormView& form, DLG& d)
+{
+    AddOptions(form, d);
     CFormField& frame =
         form.Custom({}, std::make_unique<CMemberField>(d, form.Changed(), form.Host()));
     frame.name = "frame";
-    frame.widget->setMinimumSize(400, 240);
+    frame.widget->setMinimumSize(340, 150);
     form.Note(KeyText("IDS_QM_UI_GEN_HOW"));
     form.Text(KeyText("IDS_QM_UI_GEN_ELEMENTS"),
               {[&d] { return d.ElementsText(); },
@@ -107,9 +149,8 @@ void AddMembers(CFormView& form, DLG& d)
                {{"IDS_QM_UI_GEN_ALL", [&d] { d.OnAll(); }},
                 {"IDS_QM_UI_GEN_NONE", [&d] { d.OnNone(); }},
                 {"IDS_QM_UI_GEN_STALE_BTN", [&d] { d.OnStale(); }, [&d] { return d.HasStale(); }}});
-    form.Flag(KeyText("IDS_QM_UI_GEN_KEEP_GOING"),
-              {[&d] { return d.KeepsGoing(); }, [&d](const bool& on) { d.OnKeepGoing(on); }})
-        .name = "keepGoing";
+    form.Flag(KeyText("IDS_QM_UI_GEN_KEEP_GOING"), Option(d, d.m_options.m_keepGoing)).name =
+        "keepGoing";
     const auto chosen = [&d] { return d.ChosenCount() > 0; };
     AddButtons(form, {{"IDS_QM_UI_GEN_PREVIEW", [&d] { (void)d.OnPreview(); }, chosen},
                       {"IDS_QM_UI_GEN_APPLY", [&d] { (void)d.OnApply(); }, chosen},
@@ -124,13 +165,13 @@ void AddPreview(CFormView& form, DLG& d)
         if (row >= 0 && row != d.Type()) d.OnType(row);
     };
     types.selected = [&d] { return d.Type(); };
-    AddTable(form, std::move(types), "types", {560, 100}, 150);
+    AddTable(form, std::move(types), "types", {380, 84}, 150);
     T_GRID_BINDING sides = GridOf([&d] { return d.Sides(); });
     sides.select = [&d](int row) {
         if (row >= 0 && row != d.Side()) d.OnSide(row);
     };
     sides.selected = [&d] { return d.Side(); };
-    AddTable(form, std::move(sides), "sides", {560, 100}, 150);
+    AddTable(form, std::move(sides), "sides", {380, 84}, 150);
     form.Note([&d] { return d.StatusText(); }).name = "status";
     form.Note([&d] { return d.WarningsText(); }).name = "warnings";
     form.Space();
@@ -142,7 +183,7 @@ T_PLOT BackbonePlot(const DLG& d)
     T_PLOT plot;
     const DLG::T_SHOWN* shown = d.Shown();
     if (!shown) {
-        plot.notes.push_back(zql::lib::MMSGFunction::GetValue("IDS_QM_UI_GEN_NO_PREVIEW"));
+        plot.notes.push_back(Say("IDS_QM_UI_GEN_NO_PREVIEW"));
         return plot;
     }
     plot = HingeBackbonePlot(shown->type, shown->component, shown->curve, shown->page);
@@ -160,10 +201,10 @@ void AddNumbers(CFormView& form, DLG& d)
 {
     form.Columns();
     CFormField& picture = form.Picture([&d] { return BackbonePlot(d); });
-    picture.widget->setMinimumSize(400, 260);
+    picture.widget->setMinimumSize(340, 220);
     if (auto* view = dynamic_cast<CPlotWidget*>(picture.widget)) view->SetSizeHint({480, 330});
     form.NextColumn(1);
-    AddTable(form, GridOf([&d] { return d.Trace(); }), "trace", {600, 240}, 1000);
+    AddTable(form, GridOf([&d] { return d.Trace(); }), "trace", {400, 200}, 1000);
     form.EndColumns();
 }
 

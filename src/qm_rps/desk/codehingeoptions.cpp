@@ -1,0 +1,157 @@
+#include "qm_rps/desk/codehingeoptions.h"
+
+#include "qm_base/say.h"
+#include "qm_base/textformat.h"
+
+#include <algorithm>
+
+namespace {
+
+/// A document with the content of another one, which stays the current one.
+class CTrial {
+public:
+    explicit CTrial(const CDBDoc& of)
+    {
+        CDBDoc* const current = CDBDoc::GetDocPoint();
+        m_doc = std::make_unique<CDBDoc>();
+        CDBDoc::SetDocPoint(current);
+        m_doc->Data().Assign(of.Data().Content());
+    }
+    CDBDoc& Doc() { return *m_doc; }
+
+private:
+    std::unique_ptr<CDBDoc> m_doc;
+};
+
+std::optional<HINGE_CODE> CodeOf(const T_GENERATED& made)
+{
+    const auto code = std::ranges::find(kHingeCodeNames, made.code);
+    if (code == kHingeCodeNames.end()) return {};
+    return static_cast<HINGE_CODE>(code - kHingeCodeNames.begin());
+}
+
+} // namespace
+
+CCodeHingeOptions::CCodeHingeOptions(CDBDoc& doc) : m_doc(doc)
+{
+    const auto& concrete = doc.Data().Model().styp.designCodes.concrete;
+    if (concrete && concrete->starts_with("Eurocode")) m_code = HINGE_CODE::En1998;
+}
+
+std::vector<std::string> CCodeHingeOptions::ShearTexts() const
+{
+    std::vector<std::string> texts{Say("IDS_QM_UI_GEN_SHEAR_STRENGTHS")};
+    for (const auto& entry : m_doc.Data().Model().pushovers)
+        texts.push_back(Say("IDS_QM_UI_GEN_SHEAR_PUSH", entry.second.name));
+    if (!m_pushed.empty()) texts.push_back(Say("IDS_QM_UI_GEN_SHEAR_STALE"));
+    return texts;
+}
+
+int CCodeHingeOptions::PushedCase() const
+{
+    const auto& all = m_doc.Data().Model().pushovers;
+    return m_shear < 1 || m_shear > std::ssize(all) ? 0
+                                                    : std::next(all.begin(), m_shear - 1)->first;
+}
+
+bool CCodeHingeOptions::HasMasonry() const
+{
+    return std::ranges::any_of(m_doc.Data().Model().materials, [](const auto& entry) {
+        return entry.second.type == MATL_CLASS::Masonry;
+    });
+}
+
+void CCodeHingeOptions::TakeStale(const std::vector<int>& elements)
+{
+    m_pushed.clear();
+    const T_GENERATED* first = nullptr;
+    const T_MODEL& model = m_doc.Data().Model();
+    for (const auto& entry : model.hinges) {
+        const int element = entry.second.element;
+        const auto type = model.hingeTypes.find(entry.second.hingeType);
+        if (std::ranges::find(elements, element) == elements.end() ||
+            type == model.hingeTypes.end() || !type->second.generated)
+            continue;
+        const T_GENERATED& made = *type->second.generated;
+        if (!made.pushed.empty()) m_pushed[element] = made.pushed;
+        if (!first && CodeOf(made)) first = &made;
+    }
+    m_shear = m_pushed.empty() ? 0 : static_cast<int>(std::ssize(ShearTexts())) - 1;
+    if (!first) return;
+    m_code = *CodeOf(*first);
+    m_secondary = first->secondary;
+    m_tie = FromSi(first->tie, Units(), kDimForce);
+    for (std::size_t i = 0; i < m_axial.size(); ++i) {
+        m_axial[i].reset();
+        if (!first->axialRange.empty())
+            m_axial[i] = FromSi(first->axialRange.at(i), Units(), kDimForce);
+    }
+}
+
+int CCodeHingeOptions::Read(std::vector<int> elements, T_CODE_REQUEST& out,
+                            std::string& reason) const
+{
+    T_CODE_REQUEST request;
+    request.elements = std::move(elements);
+    request.keepGoing = m_keepGoing;
+    const bool asStale = !m_pushed.empty() && m_shear == std::ssize(ShearTexts()) - 1;
+    if (asStale) request.pushed = m_pushed;
+    request.options = {m_code, m_secondary};
+    if (m_tie < 0.0) {
+        reason = Say("IDS_QM_UI_GEN_NO_TIE", ShortestText(m_tie));
+        return 0;
+    }
+    if (HasMasonry()) request.options.tie = ToSi(m_tie, Units(), kDimForce);
+    const auto& [from, to] = m_axial;
+    if (HasAxialCurves() && (from || to)) {
+        if (!from || !to || !(*from < *to)) {
+            const auto text = [](const std::optional<double>& force) {
+                return force ? ShortestText(*force) : std::string("?");
+            };
+            reason = Say("IDS_QM_GEN_RANGE", text(from) + ".." + text(to));
+            return 0;
+        }
+        request.options.axialRange = {ToSi(*from, Units(), kDimForce),
+                                      ToSi(*to, Units(), kDimForce)};
+    }
+    out = std::move(request);
+    return 1;
+}
+
+int CCodeHingeOptions::Make(CDBDoc& doc, const T_CODE_REQUEST& request, T_CODE_HINGES& out,
+                            T_HINGE_REFUSAL& refusal) const
+{
+    CCodeHinges generator(doc);
+    const int pushed = PushedCase();
+    return pushed == 0 ? generator.Generate(request, out, refusal)
+                       : generator.GenerateFromPush(request, pushed, out, refusal);
+}
+
+int CCodeHingeOptions::Generate(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
+                                T_HINGE_REFUSAL& refusal) const
+{
+    return Make(m_doc, request, out, refusal);
+}
+
+int CCodeHingeOptions::Preview(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
+                               T_HINGE_REFUSAL& refusal) const
+{
+    if (PushedCase() == 0) return CCodeHinges(m_doc).Preview(request, out, refusal);
+    CTrial trial(m_doc); // what is pushed are hinges that are there
+    return Make(trial.Doc(), request, out, refusal);
+}
+
+std::string CodeIterationsText(const T_CODE_HINGES& hinges, const T_UNITS& units)
+{
+    const auto force = [&units](double value) {
+        return FormatText("%.5g", FromSi(value, units, kDimForce));
+    };
+    std::string text;
+    int number = 0;
+    for (const T_CODE_ITERATION& it : hinges.iterations)
+        text += Say("IDS_QM_GEN_ITERATION", std::to_string(++number),
+                    std::to_string(it.change.element), FormatText("%.3g", 100.0 * it.change.change),
+                    force(it.change.before) + " -> " + force(it.change.now)) +
+                ", " + it.outcome + "\n";
+    return text;
+}
