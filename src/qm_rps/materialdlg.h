@@ -20,9 +20,24 @@ public:
     void OnNew();
 
     T_MATL_D m_material; // as edited, in current units
+    bool IsChanged() const { return !(m_material == m_read); }
+
+    /// Grades that the material may have: of steel, of concrete and of its bars.
+    bool TakesGrades(GRADE_OF of) const;
+    /// The first entry stands for values of one's own.
+    static std::vector<std::string> GradeTexts(GRADE_OF of);
+    /// The grade that was taken, while the material has its strength and modulus; else 0.
+    int GradeIndex(GRADE_OF of) const;
+    /// Its values take the place of the material's.
+    void OnGrade(GRADE_OF of, int index);
+    /// Where the grades that were taken come from, and whether that was checked; else empty.
+    std::string GradeNote() const;
+
     bool HasMean() const { return m_material.mean.has_value(); }
     /// Switched off and on again they are as they were.
     void OnMean(bool on);
+    bool HasMasonry() const { return m_material.masonry.has_value(); }
+    void OnMasonry(bool on);
     /// Of EN 1998-3: what the mean strengths are divided by; empty: not known.
     std::optional<double> Confidence() const;
 
@@ -38,6 +53,8 @@ private:
 
     CDBDoc& m_doc;
     int m_key = 0;
-    T_MATL_D m_read; // as it was read
-    T_MATL_MEAN m_mean;
+    T_MATL_D m_read;    // as it was read
+    T_MATL_MEAN m_mean; // while they are switched off
+    T_MATL_MASONRY m_masonry;
+    std::array<const T_MATL_GRADE*, 3> m_grades{}; // that were taken, by GRADE_OF
 };

@@ -8,6 +8,9 @@
 #include "qm_rps/desk/freename.h"
 #include "qm_rps/dialog/unithead.h"
 
+#include <algorithm>
+#include <cmath>
+
 CSectionDlg::CSectionDlg(CDBDoc& doc, int key) : m_doc(doc)
 {
     const auto& sections = doc.Data().Model().sections;
@@ -32,6 +35,8 @@ void CSectionDlg::Read(int key)
     m_section = m_read = std::move(section);
     if (m_section.detailing) m_detail = *m_section.detailing;
     m_bar = -1;
+    m_fillet = 0.0;
+    m_stock.clear();
 }
 
 std::vector<std::string> CSectionDlg::Names() const
@@ -73,6 +78,83 @@ void CSectionDlg::OnDetailing(bool on)
     if (on == HasDetailing()) return;
     if (!on) m_detail = *m_section.detailing;
     m_section.detailing = on ? std::optional(m_detail) : std::nullopt;
+}
+
+// ---- shape --------------------------------------------------------------------------------------
+
+bool CSectionDlg::HasFillet() const
+{
+    return m_section.shape == SECT_SHAPE::IShape || m_section.shape == SECT_SHAPE::Box;
+}
+
+void CSectionDlg::OnShape(SECT_SHAPE shape)
+{
+    if (shape == m_section.shape) return;
+    if (shape == SECT_SHAPE::Value) m_section = Calculated();
+    m_section.shape = shape;
+    if (HasFillet() == (m_section.fillet > 0.0)) return;
+    std::swap(m_section.fillet, m_fillet);
+}
+
+std::vector<std::string> CSectionDlg::StockTexts()
+{
+    std::vector<std::string> texts{Say("IDS_QM_UI_SECT_STOCK_NONE")};
+    for (const T_ROLLED_SHAPE& shape : SteelShapes())
+        texts.emplace_back(shape.name);
+    return texts;
+}
+
+/// Dimensions have gone through the units of the document.
+bool CSectionDlg::IsStock(const std::string& name) const
+{
+    std::optional<T_SECT_D> named = NamedShape(name);
+    if (!named || named->shape != m_section.shape) return false;
+    RecordFromSi(*named, Units());
+    const auto same = [](double a, double b) {
+        constexpr double kRounding = 1e-9;
+        return std::fabs(a - b) <= kRounding * std::max(std::fabs(a), std::fabs(b));
+    };
+    return std::ranges::equal(named->size, m_section.size, same) &&
+           same(named->fillet, m_section.fillet);
+}
+
+int CSectionDlg::StockIndex() const
+{
+    const std::span<const T_ROLLED_SHAPE> all = SteelShapes();
+    const auto at = std::ranges::find_if(
+        all, [this](const T_ROLLED_SHAPE& shape) { return IsStock(shape.name); });
+    return at == all.end() ? 0 : static_cast<int>(at - all.begin()) + 1;
+}
+
+void CSectionDlg::OnStock(int index)
+{
+    if (index > 0 && index <= std::ssize(SteelShapes()))
+        (void)OnStockName(SteelShapes()[static_cast<std::size_t>(index) - 1].name);
+}
+
+std::string CSectionDlg::StockName() const
+{
+    if (!m_stock.empty() && IsStock(m_stock)) return m_stock;
+    const int index = StockIndex();
+    return index > 0 ? SteelShapes()[static_cast<std::size_t>(index) - 1].name : std::string();
+}
+
+int CSectionDlg::OnStockName(const std::string& name)
+{
+    if (name.empty()) return 1; // the dimensions stay
+    std::optional<T_SECT_D> named = NamedShape(name);
+    if (!named) {
+        ShowMessage("IDS_QM_SECC_NO_SHAPE",
+                    Say("IDS_QM_SECC_NO_SHAPE", name) + ". " + Say("IDS_QM_SECC_HOLLOW"));
+        return 0;
+    }
+    RecordFromSi(*named, Units());
+    m_section.shape = named->shape;
+    m_section.size = named->size;
+    m_section.fillet = named->fillet;
+    if (m_key == 0 && m_section.name == m_read.name) m_section.name = name;
+    m_stock = name;
+    return 1;
 }
 
 T_SECT_D CSectionDlg::Calculated() const

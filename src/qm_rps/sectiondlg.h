@@ -22,6 +22,22 @@ public:
     void OnNew();
 
     T_SECT_D m_section; // as edited, in current units
+    bool IsChanged() const { return !(m_section == m_read); }
+    /// Another shape. The fillet of a shape that can't have one goes, and is there again later; one
+    /// given by values starts with those of the shape before.
+    void OnShape(SECT_SHAPE shape);
+    bool HasFillet() const;
+
+    /// Rolled shapes of the stock; the first entry stands for any other section.
+    static std::vector<std::string> StockTexts();
+    int StockIndex() const;
+    void OnStock(int index);
+    /// The rolled shape with these dimensions, or the hollow one that was named; else empty.
+    std::string StockName() const;
+    /// Takes the dimensions of a steel shape by its name (see FindShape); a new section that has
+    /// not been named gets the name. 0 with a message: there is no such shape.
+    [[nodiscard]] int OnStockName(const std::string& name);
+
     bool HasDetailing() const { return m_section.detailing.has_value(); }
     /// Switched off and on again it is as it was.
     void OnDetailing(bool on);
@@ -51,6 +67,7 @@ public:
 
 private:
     bool MayLeave();
+    bool IsStock(const std::string& name) const;
     void Read(int key);
     int Store();
 
@@ -58,4 +75,6 @@ private:
     int m_key = 0;
     T_SECT_D m_read;        // as it was read
     T_SECT_DETAIL m_detail; // while it is switched off
+    double m_fillet = 0.0;  // while the shape can't have one
+    std::string m_stock;    // the shape that was named
 };

@@ -5,10 +5,13 @@
 #include "qm_ui/push/stepfield.h"
 #include "qm_ui/section/sectionplot.h"
 
+#include <QLabel>
+
 namespace {
 
 using DLG = CSectionCurvesDlg;
 constexpr QSize kPicture{720, 440};
+constexpr int kCaption = 170, kField = 200; // widths: the pictures take the room that is left
 
 /// A member of the options as a position in a list; a change calculates anew.
 template <class E>
@@ -33,33 +36,41 @@ T_BINDING<T> Member(DLG& d, T& value)
 
 void AddOptions(CFormView& form, DLG& d)
 {
-    form.Choice(KeyText("IDS_QM_UI_HEAD_SECTION"),
-                {[&d] { return d.PairIndex(); }, [&d](const int& i) { d.OnSelChangePair(i); }},
-                [&d] { return d.PairTexts(); })
-        .name = "section";
-    form.Choice(KeyText("IDS_QM_UI_SECC_VALUES"), Option(d, &T_SECTION_OPTIONS::values),
-                KeyTexts({"IDS_QM_SECC_CHARACTERISTIC", "IDS_QM_SECC_MEAN", "IDS_QM_SECC_EXPECTED",
-                          "IDS_QM_SECC_LOWER", "IDS_QM_SECC_DESIGN", "IDS_QM_SECC_ASSESSED"}))
-        .name = "values";
-    form.Choice(KeyText("IDS_QM_UI_SECC_LAW"), Option(d, &T_SECTION_OPTIONS::law),
-                KeyTexts({"IDS_QM_SECC_LAW_EUROCODE", "IDS_QM_SECC_LAW_ACI"}))
-        .name = "law";
-    form.Choice(KeyText("IDS_QM_UI_SECC_CORE"), Option(d, &T_SECTION_OPTIONS::core),
-                KeyTexts({"IDS_QM_UI_SECC_CORE_PLAIN", "IDS_QM_SECC_CORE_MANDER",
-                          "IDS_QM_SECC_CORE_EUROCODE"}))
-        .name = "core";
-    form.Number(KeyText("IDS_QM_UI_SECC_DIRECTION"), Member(d, d.m_directionDeg)).name =
-        "direction";
-    form.Text([&d] { return Say("IDS_QM_UI_SECC_AXIAL", NameOf(d.Units().force)); },
-              Member(d, d.m_axial))
-        .name = "axial";
-    form.Number(KeyText("IDS_QM_UI_SECC_ALPHA"), Member(d, d.m_options.alphaCc)).name = "alphaCc";
-    form.Number(KeyText("IDS_QM_UI_SECC_STEEL_STRAIN"), Member(d, d.m_options.steelStrain)).name =
-        "steelStrain";
-    form.Number(KeyText("IDS_QM_UI_SECC_HARDENING"), Member(d, d.m_options.hardening)).name =
-        "hardening";
-    form.Number(KeyText("IDS_QM_UI_SECC_HOOP"), Member(d, d.m_options.hoopStrain)).name =
-        "hoopStrain";
+    const auto narrow = [](CFormField& field, const char* name) {
+        field.name = name;
+        field.label->setWordWrap(true);
+        field.label->setFixedWidth(kCaption);
+        field.widget->setFixedWidth(kField);
+    };
+    narrow(
+        form.Choice(KeyText("IDS_QM_UI_HEAD_SECTION"),
+                    {[&d] { return d.PairIndex(); }, [&d](const int& i) { d.OnSelChangePair(i); }},
+                    [&d] { return d.PairTexts(); }),
+        "section");
+    narrow(form.Choice(
+               KeyText("IDS_QM_UI_SECC_VALUES"), Option(d, &T_SECTION_OPTIONS::values),
+               KeyTexts({"IDS_QM_SECC_CHARACTERISTIC", "IDS_QM_SECC_MEAN", "IDS_QM_SECC_EXPECTED",
+                         "IDS_QM_SECC_LOWER", "IDS_QM_SECC_DESIGN", "IDS_QM_SECC_ASSESSED"})),
+           "values");
+    narrow(form.Choice(KeyText("IDS_QM_UI_SECC_LAW"), Option(d, &T_SECTION_OPTIONS::law),
+                       KeyTexts({"IDS_QM_SECC_LAW_EUROCODE", "IDS_QM_SECC_LAW_ACI"})),
+           "law");
+    narrow(form.Choice(KeyText("IDS_QM_UI_SECC_CORE"), Option(d, &T_SECTION_OPTIONS::core),
+                       KeyTexts({"IDS_QM_UI_SECC_CORE_PLAIN", "IDS_QM_SECC_CORE_MANDER",
+                                 "IDS_QM_SECC_CORE_EUROCODE"})),
+           "core");
+    narrow(form.Number(KeyText("IDS_QM_UI_SECC_DIRECTION"), Member(d, d.m_directionDeg)),
+           "direction");
+    narrow(form.Text([&d] { return Say("IDS_QM_UI_SECC_AXIAL", NameOf(d.Units().force)); },
+                     Member(d, d.m_axial)),
+           "axial");
+    narrow(form.Number(KeyText("IDS_QM_UI_SECC_ALPHA"), Member(d, d.m_options.alphaCc)), "alphaCc");
+    narrow(form.Number(KeyText("IDS_QM_UI_SECC_STEEL_STRAIN"), Member(d, d.m_options.steelStrain)),
+           "steelStrain");
+    narrow(form.Number(KeyText("IDS_QM_UI_SECC_HARDENING"), Member(d, d.m_options.hardening)),
+           "hardening");
+    narrow(form.Number(KeyText("IDS_QM_UI_SECC_HOOP"), Member(d, d.m_options.hoopStrain)),
+           "hoopStrain");
     form.Note(KeyText("IDS_QM_SECC_SIGNS"));
     form.Space();
 }

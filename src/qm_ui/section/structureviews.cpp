@@ -1,39 +1,15 @@
 #include "qm_ui/section/structureviews.h"
 
-#include "qm_base/say.h"
-#include "qm_base/textformat.h"
-#include "qm_rps/dialog/unithead.h"
-#include "qm_rps/materialdlg.h"
 #include "qm_rps/sectiondlg.h"
 #include "qm_ui/plot/plotwidget.h"
 #include "qm_ui/section/sectionbarsplot.h"
+#include "qm_ui/section/structurefields.h"
 
 #include <array>
 
 namespace {
 
 constexpr std::size_t kSizes = 4;
-
-/// A caption with the unit of a length or of a stress.
-template <class DLG>
-TextFn Head(const DLG& d, const char* key, T_DIM dim)
-{
-    return [&d, key, dim] { return HeadWithUnit(Say(key), dim, d.Units()); };
-}
-
-/// The record that is edited, and a button for a new one.
-template <class DLG>
-void AddChoice(CFormView& form, DLG& d, const char* caption)
-{
-    form.Columns();
-    form.Choice(KeyText(caption),
-                {[&d] { return d.Index(); }, [&d](const int& index) { d.OnSelChange(index); }},
-                [&d] { return d.Names(); })
-        .name = "record";
-    form.NextColumn();
-    form.Button(KeyText("IDS_QM_UI_SECT_NEW"), [&d] { d.OnNew(); }).name = "new";
-    form.EndColumns();
-}
 
 // ---- section ------------------------------------------------------------------------------------
 
@@ -55,8 +31,10 @@ const char* SizeKey(SECT_SHAPE shape, std::size_t i)
 
 void AddDimensions(CFormView& form, CSectionDlg& d)
 {
-    form.Text(KeyText("IDS_QM_UI_HEAD_NAME"), Ref(d.m_section.name)).name = "name";
-    form.Choice(KeyText("IDS_QM_UI_HEAD_SHAPE"), IndexRef(d.m_section.shape),
+    form.Page(KeyText("IDS_QM_UI_SECT_DIMENSIONS"));
+    form.Choice(KeyText("IDS_QM_UI_HEAD_SHAPE"),
+                {[&d] { return static_cast<int>(d.m_section.shape); },
+                 [&d](const int& index) { d.OnShape(static_cast<SECT_SHAPE>(index)); }},
                 KeyTexts({"IDS_QM_UI_SHAPE_VALUE", "IDS_QM_UI_SHAPE_RECTANGLE",
                           "IDS_QM_UI_SHAPE_CIRCLE", "IDS_QM_UI_SHAPE_PIPE", "IDS_QM_UI_SHAPE_BOX",
                           "IDS_QM_UI_SHAPE_I"}))
@@ -71,21 +49,73 @@ void AddDimensions(CFormView& form, CSectionDlg& d)
         field.name = "size" + std::to_string(i);
         field.shown = [&d, i] { return SizeKey(d.m_section.shape, i) != nullptr; };
     }
+    CFormField& fillet =
+        form.Number(Head(d, "IDS_QM_UI_SECT_FILLET", kDimLength), Ref(d.m_section.fillet));
+    fillet.name = "fillet";
+    fillet.shown = [&d] { return d.HasFillet(); };
+    form.Group(KeyText("IDS_QM_UI_SECT_STOCK"));
+    form.Choice(KeyText("IDS_QM_UI_SECT_STOCK_ROLLED"),
+                {[&d] { return d.StockIndex(); }, [&d](const int& index) { d.OnStock(index); }},
+                [] { return CSectionDlg::StockTexts(); })
+        .name = "stock";
+    form.Text(KeyText("IDS_QM_UI_SECT_STOCK_NAME"),
+              {[&d] { return d.StockName(); },
+               [&d](const std::string& name) { (void)d.OnStockName(name); }})
+        .name = "stockName";
+    form.EndGroup();
+    form.Space();
 }
 
-/// A member of the detailing, which may be switched off.
-template <class T>
-T_BINDING<T> Detail(CSectionDlg& d, T T_SECT_DETAIL::*member)
+/// Values that belong to the dimensions; typed where the shape has none.
+void AddProperties(CFormView& form, CSectionDlg& d)
 {
-    return {[&d, member] { return d.HasDetailing() ? (*d.m_section.detailing).*member : T{}; },
-            [&d, member](const T& value) {
-                if (d.HasDetailing()) (*d.m_section.detailing).*member = value;
-            }};
+    constexpr T_DIM kArea{0, 2}, kModulus{0, 3}, kInertia{0, 4};
+    using R = T_SECT_D;
+    const std::tuple<const char*, double R::*, T_DIM, const char*> rows[] = {
+        {"IDS_QM_UI_SECT_A", &R::area, kArea, "A"},
+        {"IDS_QM_UI_SECT_ASY", &R::Asy, kArea, "Asy"},
+        {"IDS_QM_UI_SECT_ASZ", &R::Asz, kArea, "Asz"},
+        {"IDS_QM_UI_SECT_J", &R::J, kInertia, "J"},
+        {"IDS_QM_UI_SECT_IY", &R::Iyy, kInertia, "Iy"},
+        {"IDS_QM_UI_SECT_IZ", &R::Izz, kInertia, "Iz"},
+        {"IDS_QM_UI_SECT_ZY", &R::Zy, kModulus, "Zy"},
+        {"IDS_QM_UI_SECT_ZZ", &R::Zz, kModulus, "Zz"}};
+    form.Page(KeyText("IDS_QM_UI_SECT_PROPERTIES"));
+    for (const auto& [key, member, dim, name] : rows) {
+        CFormField& field =
+            form.Number(Head(d, key, dim),
+                        {[&d, member = member] { return d.Calculated().*member; },
+                         [&d, member = member](const double& v) { d.m_section.*member = v; }});
+        field.name = name;
+        field.enabled = [&d] { return d.m_section.shape == SECT_SHAPE::Value; };
+    }
+    form.Note(KeyText("IDS_QM_UI_SECT_PROPERTIES_NOTE"));
+    form.Space();
+}
+
+void AddFactors(CFormView& form, CSectionDlg& d)
+{
+    using F = T_SECT_FACTORS;
+    constexpr std::pair<const char*, double F::*> kFactors[] = {
+        {"area", &F::area}, {"Asy", &F::Asy}, {"Asz", &F::Asz},
+        {"J", &F::J},       {"Iyy", &F::Iyy}, {"Izz", &F::Izz}};
+    form.Page(KeyText("IDS_QM_UI_SECT_FACTORS"));
+    form.Cells({[] { return std::string(); }, PlainLabel("I"), PlainLabel("J")});
+    for (const auto& [text, member] : kFactors) {
+        form.Note(PlainLabel(text));
+        form.Number(PlainLabel(text), Ref(d.m_section.factorsI.*member)).name =
+            std::string("factors_I.") + text;
+        form.Number(PlainLabel(text), Ref(d.m_section.factorsJ.*member)).name =
+            std::string("factors_J.") + text;
+    }
+    form.EndCells();
+    form.Note(KeyText("IDS_QM_UI_SECT_FACTORS_NOTE"));
+    form.Space();
 }
 
 void AddDetailing(CFormView& form, CSectionDlg& d)
 {
-    form.Group(KeyText("IDS_QM_UI_SECT_DETAILING"));
+    form.Page(KeyText("IDS_QM_UI_SECT_DETAILING"));
     form.Flag(KeyText("IDS_QM_UI_SECT_HAS_DETAILING"),
               {[&d] { return d.HasDetailing(); }, [&d](const bool& on) { d.OnDetailing(on); }})
         .name = "detailing";
@@ -95,25 +125,26 @@ void AddDetailing(CFormView& form, CSectionDlg& d)
         field.enabled = has;
     };
     using D = T_SECT_DETAIL;
+    const auto detail = [&d](auto member) { return PartRef(d.m_section.detailing, member); };
     const std::tuple<const char*, double D::*, const char*> lengths[] = {
         {"IDS_QM_UI_SECT_COVER", &D::cover, "cover"},
         {"IDS_QM_UI_SECT_STIRRUP", &D::stirrupDiameter, "stirrup_diameter"},
         {"IDS_QM_UI_SECT_SPACING", &D::stirrupSpacing, "stirrup_spacing"},
         {"IDS_QM_UI_SECT_LAP", &D::lapLength, "lap_length"}};
     for (const auto& [key, member, name] : lengths)
-        add(form.Number(Head(d, key, kDimLength), Detail(d, member)), name);
-    add(form.Integer(KeyText("IDS_QM_UI_SECT_LEGS_Y"), Detail(d, &D::legsY)), "legs_y");
-    add(form.Integer(KeyText("IDS_QM_UI_SECT_LEGS_Z"), Detail(d, &D::legsZ)), "legs_z");
-    const T_BINDING<STIRRUP_HOOKS> hooks = Detail(d, &D::hooks);
+        add(form.Number(Head(d, key, kDimLength), detail(member)), name);
+    add(form.Integer(KeyText("IDS_QM_UI_SECT_LEGS_Y"), detail(&D::legsY)), "legs_y");
+    add(form.Integer(KeyText("IDS_QM_UI_SECT_LEGS_Z"), detail(&D::legsZ)), "legs_z");
+    const T_BINDING<STIRRUP_HOOKS> hooks = detail(&D::hooks);
     add(form.Choice(
             KeyText("IDS_QM_UI_SECT_HOOKS"),
             {[hooks] { return static_cast<int>(hooks.get()); },
              [hooks](const int& index) { hooks.set(static_cast<STIRRUP_HOOKS>(index)); }},
             KeyTexts({"IDS_QM_UI_HOOKS_135", "IDS_QM_UI_HOOKS_90", "IDS_QM_UI_HOOKS_NONE"})),
         "hooks");
-    add(form.Flag(KeyText("IDS_QM_UI_SECT_IN_CORE"), Detail(d, &D::tiesInCore)), "ties_in_core");
-    add(form.Flag(KeyText("IDS_QM_UI_SECT_SPLICE"), Detail(d, &D::poorSplice)), "poor_splice");
-    form.EndGroup();
+    add(form.Flag(KeyText("IDS_QM_UI_SECT_IN_CORE"), detail(&D::tiesInCore)), "ties_in_core");
+    add(form.Flag(KeyText("IDS_QM_UI_SECT_SPLICE"), detail(&D::poorSplice)), "poor_splice");
+    form.Space();
 }
 
 T_GRID_BINDING BarGrid(CSectionDlg& d)
@@ -168,7 +199,7 @@ void AddBars(CFormView& form, CSectionDlg& d)
     form.EndGroup();
     CFormField& grid = form.Grid(BarGrid(d));
     grid.name = "bars";
-    grid.widget->setMinimumSize(400, 160);
+    grid.widget->setMinimumSize(340, 110);
     grid.widget->setMaximumHeight(240); // the picture takes the room that is left
     form.Note([&d] { return d.BarsText(); });
 }
@@ -177,100 +208,20 @@ void BuildSection(CFormView& form, CSectionDlg& d)
 {
     AddChoice(form, d, "IDS_QM_UI_HEAD_SECTION");
     form.Columns();
+    form.Text(KeyText("IDS_QM_UI_HEAD_NAME"), Ref(d.m_section.name)).name = "name";
     AddDimensions(form, d);
     AddDetailing(form, d);
-    form.Space();
+    AddProperties(form, d);
+    AddFactors(form, d);
+    form.EndPages();
     form.NextColumn(1);
     CFormField& picture = form.Picture([&d] { return SectionBarsPlot(d.m_section, d.Units()); });
-    picture.widget->setMinimumSize(420, 300);
+    picture.widget->setMinimumSize(340, 200);
     if (auto* view = dynamic_cast<CPlotWidget*>(picture.widget)) view->SetSizeHint({480, 340});
     AddBars(form, d);
     form.EndColumns();
     form.SetFindings([&d] { return d.Findings(); });
-}
-
-// ---- material -----------------------------------------------------------------------------------
-
-/// A member of the mean strengths, which may be switched off.
-T_BINDING<double> Mean(CMaterialDlg& d, double T_MATL_MEAN::*member)
-{
-    return {[&d, member] { return d.HasMean() ? (*d.m_material.mean).*member : 0.0; },
-            [&d, member](const double& value) {
-                if (d.HasMean()) (*d.m_material.mean).*member = value;
-            }};
-}
-
-void AddKnown(CFormView& form, CMaterialDlg& d)
-{
-    form.Group(KeyText("IDS_QM_UI_MATL_EXISTING"));
-    form.Flag(KeyText("IDS_QM_UI_MATL_HAS_MEAN"),
-              {[&d] { return d.HasMean(); }, [&d](const bool& on) { d.OnMean(on); }})
-        .name = "hasMean";
-    const std::tuple<const char*, double T_MATL_MEAN::*, const char*> means[] = {
-        {"IDS_QM_UI_MATL_FCM", &T_MATL_MEAN::fc, "mean.fc"},
-        {"IDS_QM_UI_MATL_FYM", &T_MATL_MEAN::fy, "mean.fy"},
-        {"IDS_QM_UI_MATL_FYWM", &T_MATL_MEAN::fyw, "mean.fyw"}};
-    for (const auto& [key, member, name] : means) {
-        CFormField& field = form.Number(Head(d, key, kDimStress), Mean(d, member));
-        field.name = name;
-        field.enabled = [&d] { return d.HasMean(); };
-    }
-    auto& knowledge = d.m_material.knowledge;
-    form.Choice(KeyText("IDS_QM_UI_MATL_KNOWLEDGE"),
-                {[&knowledge] { return knowledge ? static_cast<int>(*knowledge) + 1 : 0; },
-                 [&knowledge](const int& index) {
-                     knowledge.reset();
-                     if (index > 0) knowledge = static_cast<MATL_KNOWLEDGE>(index - 1);
-                 }},
-                [] {
-                    std::vector<std::string> texts{Say("IDS_QM_UI_MATL_UNKNOWN")};
-                    for (const char* key :
-                         {"IDS_QM_UI_MATL_KL1", "IDS_QM_UI_MATL_KL2", "IDS_QM_UI_MATL_KL3"})
-                        texts.push_back(Say(key));
-                    return texts;
-                })
-        .name = "knowledge";
-    form.Optional(KeyText("IDS_QM_UI_MATL_CF"), Ref(d.m_material.confidence)).name =
-        "confidence_factor";
-    form.Note([&d] {
-        const std::optional<double> factor = d.Confidence();
-        return factor ? Say("IDS_QM_UI_MATL_CF_USED", FormatText("%.4g", *factor))
-                      : Say("IDS_QM_UI_MATL_CF_NONE");
-    });
-    form.Note(KeyText("IDS_QM_UI_MATL_NOTE"));
-    form.EndGroup();
-}
-
-void BuildMaterial(CFormView& form, CMaterialDlg& d)
-{
-    AddChoice(form, d, "IDS_QM_UI_HEAD_MATERIAL");
-    T_MATL_D& m = d.m_material;
-    form.Text(KeyText("IDS_QM_UI_HEAD_NAME"), Ref(m.name)).name = "name";
-    form.Choice(KeyText("IDS_QM_UI_HEAD_CLASS"), IndexRef(m.type),
-                KeyTexts({"IDS_QM_UI_MATL_CONCRETE", "IDS_QM_UI_MATL_STEEL",
-                          "IDS_QM_UI_MATL_COMPOSITE", "IDS_QM_UI_MATL_MASONRY"}))
-        .name = "type";
-    const auto is = [&m](std::initializer_list<MATL_CLASS> classes) {
-        return [&m, all = std::vector(classes)] {
-            return std::ranges::find(all, m.type) != all.end();
-        };
-    };
-    using C = MATL_CLASS;
-    const auto bars = is({C::Concrete, C::Composite});
-    form.Number(Head(d, "IDS_QM_UI_MATL_E", kDimStress), Ref(m.E)).name = "E";
-    form.Number(KeyText("IDS_QM_UI_MATL_NU"), Ref(m.nu)).name = "nu";
-    const std::tuple<const char*, double*, const char*, std::function<bool()>> strengths[] = {
-        {"IDS_QM_UI_MATL_FY", &m.Fy, "fy", is({C::Steel, C::Composite})},
-        {"IDS_QM_UI_MATL_FCK", &m.fck, "fck", is({C::Concrete, C::Composite, C::Masonry})},
-        {"IDS_QM_UI_MATL_FYK", &m.fyk, "fyk", bars},
-        {"IDS_QM_UI_MATL_ES", &m.Es, "Es", bars}};
-    for (const auto& [key, value, name, shown] : strengths) {
-        CFormField& field = form.Number(Head(d, key, kDimStress), Ref(*value));
-        field.name = name;
-        field.shown = shown;
-    }
-    AddKnown(form, d);
-    form.SetFindings([&d] { return d.Findings(); });
+    form.m_isChanged = [&d] { return d.IsChanged(); };
 }
 
 } // namespace
@@ -278,7 +229,6 @@ void BuildMaterial(CFormView& form, CMaterialDlg& d)
 void RegisterStructureForms(CViewFactory& factory)
 {
     factory.Register<CSectionDlg>(KeyText("IDS_QM_UI_SECT_TITLE"), BuildSection,
-                                  {.size = {980, 780}});
-    factory.Register<CMaterialDlg>(KeyText("IDS_QM_UI_MATL_TITLE"), BuildMaterial,
-                                   {.size = {560, 0}});
+                                  {.size = {980, 720}});
+    RegisterMaterialForm(factory);
 }

@@ -4,3 +4,4 @@
 #include "qm_ui/form/viewfactory.h"
 
 void RegisterStructureForms(CViewFactory& factory);
+void RegisterMaterialForm(CViewFactory& factory); // of these, the one of materials
