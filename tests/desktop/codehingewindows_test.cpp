@@ -1,12 +1,15 @@
 // The window that gives members the hinges of a code, with real events.
 #include "windowplay.h"
 
+#include "pushoverwindow.h"
 #include "qm_db/editscope.h"
 #include "qm_rps/generate/generatedtypes.h"
 #include "qm_ui/frame/frameview.h"
 
 #include <QComboBox>
+#include <QLineEdit>
 #include <QMouseEvent>
+#include <QPushButton>
 
 using namespace desktop_test;
 
@@ -85,6 +88,12 @@ TEST_F(CodeHingeWindows, MembersAreChosenOnTheFrameAndByTheirNumbers)
         EXPECT_EQ("1-6, 11-14", TextAt(w, "elements"));
         Enter(w, "elements", "2, 5-6");
         EXPECT_TRUE(Says(w, "3 elements are chosen"));
+        auto* const elements = qobject_cast<QLineEdit*>(Field(w, "elements"));
+        elements->selectAll();
+        Key(elements, 0, "4");
+        Key(elements, Qt::Key_Return); // taken, and the window stays
+        EXPECT_TRUE(w.isVisible());
+        EXPECT_TRUE(Says(w, "1 elements are chosen"));
         Cancel(w);
     });
 }
@@ -185,7 +194,6 @@ TEST_F(CodeHingeWindows, APushGivesTheShearAndStaleTypesKeepIt)
 {
     CDBDoc& doc = m_main->Doc();
     const long before = doc.Data().Revision();
-    std::vector<double> pushed;
     Show([&](CDialogWindow& w) {
         auto* const shear = qobject_cast<QComboBox*>(Field(w, "shear"));
         ASSERT_NE(nullptr, shear);
@@ -213,7 +221,7 @@ TEST_F(CodeHingeWindows, APushGivesTheShearAndStaleTypesKeepIt)
             if (hinge.element == element) return *Model().hingeTypes.at(hinge.hingeType).generated;
         throw std::out_of_range("no hinge");
     };
-    pushed = of(11).pushed;
+    const std::vector<double> pushed = of(11).pushed;
     T_SECT_D beam;
     ASSERT_TRUE(doc.Attr().GetSect(2, beam));
     beam.detailing->stirrupSpacing = 0.1;
@@ -280,4 +288,48 @@ TEST_F(CodeHingeWindows, AxialForcesAreThoseOfTheUnitsAndOfTheStaleTypes)
     });
     for (const auto& [key, type] : Model().hingeTypes)
         EXPECT_EQ((std::vector<double>{1e5, 3e5}), type.generated->axialRange);
+}
+
+TEST_F(CodeHingeWindows, HingesArePushedEvaluatedAndJudgedAsByCommands)
+{
+    Show([](CDialogWindow& w) {
+        Push(w, "IDS_QM_UI_GEN_ALL");
+        Push(w, "IDS_QM_UI_GEN_APPLY");
+        Cancel(w);
+    });
+    {
+        const auto ended = [](CDialogWindow& w) {
+            return w.findChild<QPushButton*>("IDS_QM_UI_PUSH_RUN_HINGES")->isEnabled();
+        };
+        CPlay play({{"Push", Press("IDS_QM_UI_PUSH_RUN_START")}, {"Push", Cancel, ended}});
+        Run("IDS_QM_UI_PUSH_RUN");
+    }
+    Run("IDS_QM_UI_PUSH_CURVE");
+    CPushOverWindow& curve = CPushOverWindow::Show(m_main->Desktop());
+    Settle();
+    ChooseIndex(Field(curve, "open"), 1);
+    QStringList rows;
+    {
+        CPlay play({{"Judgement of member ends", [&](CDialogWindow& w) {
+                         constexpr int kFirst = 6, kLast = 16; // N to V/VR
+                         QAbstractItemModel& ends = Grid(w, "ends").Model();
+                         for (int row = 0; row < ends.rowCount(); ++row) {
+                             QStringList numbers;
+                             for (int c = kFirst; c <= kLast; ++c)
+                                 numbers << Cell(ends, row, c);
+                             rows << numbers.join(' ');
+                         }
+                         Cancel(w);
+                     }}});
+        Push(curve, "judge");
+    }
+    const QString coded = File("coded.json");
+    (void)Program({"hinge", "generate", Example("rc-frame-code-hinges"), "--code", "EN1998-3",
+                   "--all", "-o", coded});
+    const QString printed =
+        QString::fromUtf8(Program({"judge", coded, "--evaluation", "PX EC8", "--all-rows"}))
+            .simplified();
+    ASSERT_EQ(20, rows.size()); // two ends of ten members at the limit state that is shown
+    for (const QString& row : rows)
+        EXPECT_TRUE(printed.contains(row)) << row.toStdString();
 }

@@ -10,7 +10,6 @@
 #include <QAction>
 #include <QFileInfo>
 #include <QLabel>
-#include <QProcess>
 #include <QRegularExpression>
 #include <QSlider>
 #include <QSpinBox>
@@ -24,16 +23,6 @@ constexpr const char* kFrame = "rc-frame-3-storey";
 QByteArray Contents(const QString& path)
 {
     return QByteArray::fromStdString(ReadText(path.toStdString()));
-}
-
-/// Runs the command line program; what it printed.
-QByteArray Program(const QStringList& arguments)
-{
-    QProcess process;
-    process.start(QM_RPS_PROGRAM, arguments);
-    EXPECT_TRUE(process.waitForFinished());
-    EXPECT_EQ(0, process.exitCode()) << process.readAllStandardError().toStdString();
-    return process.readAllStandardOutput();
 }
 
 /// The first number after a text, on from another one.

@@ -13,6 +13,7 @@
 #include <QMessageBox>
 #include <QMouseEvent>
 #include <QPointer>
+#include <QProcess>
 #include <QPushButton>
 #include <QSettings>
 #include <QStandardPaths>
@@ -26,6 +27,15 @@ namespace desktop_test {
 QString Example(const char* name)
 {
     return QStringLiteral(QM_PROJECT "/examples/%1/case.json").arg(name);
+}
+
+QByteArray Program(const QStringList& arguments)
+{
+    QProcess process;
+    process.start(QM_RPS_PROGRAM, arguments);
+    EXPECT_TRUE(process.waitForFinished());
+    EXPECT_EQ(0, process.exitCode()) << process.readAllStandardError().toStdString();
+    return process.readAllStandardOutput();
 }
 
 void Settle()

@@ -19,6 +19,9 @@ namespace desktop_test {
 /// Path of an example's case file.
 QString Example(const char* name);
 
+/// Runs the command line program; what it printed.
+QByteArray Program(const QStringList& arguments);
+
 /// Lets what has come in be handled.
 void Settle();
 /// A key to a widget: with a text, or by its code.
