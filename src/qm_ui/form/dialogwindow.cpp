@@ -86,8 +86,11 @@ bool CDialogWindow::MayDrop()
     return m_dialogView.AskYesNo(kKey, zql::lib::MMSGFunction::GetValue(kKey));
 }
 
+/// Enter takes what is typed; a window without OK is not closed by it.
 void CDialogWindow::keyPressEvent(QKeyEvent* event)
 {
+    const bool enter = event->key() == Qt::Key_Return || event->key() == Qt::Key_Enter;
+    if (enter && m_view.showsOnly && m_form->isAncestorOf(focusWidget())) return;
     if (event->matches(QKeySequence::Cancel) && !MayDrop()) return;
     QDialog::keyPressEvent(event);
 }

@@ -84,7 +84,7 @@ void CFormView::EndGroup()
     if (grows) LetGrow();
 }
 
-void CFormView::Columns()
+void CFormView::Columns(int stretch)
 {
     auto* row = new QWidget(this);
     AddWide(row);
@@ -93,7 +93,7 @@ void CFormView::Columns()
     box.columns->setContentsMargins(0, 0, 0, 0);
     m_boxes.push_back(box);
     m_boxes.push_back({});
-    NextColumn();
+    NextColumn(stretch);
 }
 
 /// Whether something in the innermost box takes the room that is left.

@@ -7,6 +7,7 @@
 
 #include "qm_base/finding.h"
 #include "qm_ui/form/formfields.h"
+#include "qm_ui/form/formheight.h"
 #include "qm_ui/form/gridbinding.h"
 
 #include <QWidget>
@@ -24,9 +25,9 @@ public:
     // ---- layout; what is added next goes into the innermost open one ----
     void Group(TextFn title);
     void EndGroup();
-    /// Side by side: Columns, fields, NextColumn, fields, EndColumns.
-    void Columns();
-    /// stretch above 0: this column takes the width that is left.
+    /// Side by side: Columns, fields, NextColumn, fields, EndColumns. stretch above 0: this column
+    /// takes the width that is left.
+    void Columns(int stretch = 0);
     void NextColumn(int stretch = 0);
     void EndColumns();
     /// Pages of a tab: Page ... Page ... EndPages. `shown` as for fields.
@@ -79,6 +80,8 @@ public:
     bool IsTouched() const;
     /// Number of marked fields.
     int Marks() const;
+    /// What it needs: tables and pictures give room before the form has to be scrolled.
+    int heightForWidth(int width) const override { return LeastFormHeight(*this, width); }
     /// The field with that name, or null.
     CFormField* Find(const std::string& name);
 

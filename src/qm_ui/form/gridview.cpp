@@ -55,16 +55,14 @@ CGridView::CGridView(T_GRID_BINDING binding, ChangedFn changed, QWidget* parent)
     setModel(m_model);
     setItemDelegate(new CCellDelegate(this));
     setAlternatingRowColors(true);
-    setTabKeyNavigation(true);
     setEditTriggers(DoubleClicked | EditKeyPressed | AnyKeyPressed);
     setSelectionMode(ContiguousSelection);
     const auto& columns = m_model->Binding().columns;
     const bool edits = std::any_of(columns.begin(), columns.end(), [](const auto& c) {
         return c.edit && c.kind != CELL_KIND::Flag;
     });
-    if (!edits) {
-        setSelectionBehavior(SelectRows);
-    }
+    setTabKeyNavigation(edits); // else Tab goes on to what follows the table
+    if (!edits) setSelectionBehavior(SelectRows);
     verticalHeader()->setSectionResizeMode(QHeaderView::Fixed);
     horizontalHeader()->setSectionResizeMode(QHeaderView::Interactive);
     connect(selectionModel(), &QItemSelectionModel::currentRowChanged, this,
@@ -84,6 +82,9 @@ CGridView::CGridView(T_GRID_BINDING binding, ChangedFn changed, QWidget* parent)
 void CGridView::Refresh()
 {
     m_model->Refresh();
+    for (int c = 0; c < m_model->columnCount(); ++c) // a table may use fewer than it has
+        setColumnHidden(
+            c, m_model->headerData(c, Qt::Horizontal, Qt::DisplayRole).toString().isEmpty());
     if (isVisible()) FitColumns();
     FollowChoice();
 }
@@ -107,14 +108,16 @@ void CGridView::CapWidest()
     const int bar = verticalScrollBar()->sizeHint().width(); // it may come up yet
     const int room = std::min(viewport()->width(), maximumViewportSize().width() - bar);
     const int others = total - columnWidth(widest);
-    if (total > room && columnWidth(widest) > room / 2)
-        setColumnWidth(widest, std::max(room - others, room / 2));
+    m_capped = total > room && columnWidth(widest) > room / 2;
+    if (m_capped) setColumnWidth(widest, std::max(room - others, room / 2));
 }
 
 void CGridView::resizeEvent(QResizeEvent* event)
 {
     QTableView::resizeEvent(event);
-    CapWidest();
+    if (!m_capped) return CapWidest();
+    m_capped = false; // scroll bars that come or go resize it once more
+    FitColumns();
 }
 
 /// Tables on pages behind are measured when they come to the front.

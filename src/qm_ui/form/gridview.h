@@ -35,5 +35,6 @@ private:
 
     CGridModel* m_model;
     ChangedFn m_changed;
-    bool m_quiet = false; // the model's own choice is being shown
+    bool m_capped = false; // the widest column had to be
+    bool m_quiet = false;  // the model's own choice is being shown
 };
