@@ -72,7 +72,7 @@ void BuildEuro(CFormView& form, DLG& dlg)
         form.Page(KeyText(title));
         form.Columns();
         AddPage(form, dlg, end, end == HINGE_END::J ? "J." : "");
-        form.NextColumn();
+        form.NextColumn(1);
         AddBackbonePicture(form, [&dlg, end, title](bool box) {
             return HingeBackbonePlot(dlg.m_owner.type, dlg.Which(), *dlg.Curve(end),
                                      zql::lib::MMSGFunction::GetValue(title), box);

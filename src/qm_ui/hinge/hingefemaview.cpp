@@ -225,7 +225,7 @@ void BuildFema(CFormView& form, DLG& dlg)
         AddBackbonePage(form, page);
         AddOptionsPage(form, page);
         form.EndPages();
-        form.NextColumn();
+        form.NextColumn(1);
         AddBackbonePicture(form, [page](bool box) { return Preview(page, box); }).name =
             page.prefix + "picture";
         form.EndColumns();

@@ -1,6 +1,7 @@
 #include "qm_ui/hinge/hingefieldsview.h"
 
 #include "qm_base/msgfunction.h"
+#include "qm_ui/plot/plotwidget.h"
 
 #include <algorithm>
 
@@ -201,6 +202,11 @@ CFormField& MarkedGrid(CFormView& form, std::shared_ptr<CNumberGrid> grid,
     return form.Grid(std::move(b));
 }
 
+void LeaveWidth(CFormField& picture)
+{
+    if (auto* view = dynamic_cast<CPlotWidget*>(picture.widget)) view->SetSizeHint({420, 480});
+}
+
 CFormField& AddBackbonePicture(CFormView& form, std::function<T_PLOT(bool box)> plot)
 {
     const auto box = std::make_shared<bool>(false);
@@ -208,5 +214,7 @@ CFormField& AddBackbonePicture(CFormView& form, std::function<T_PLOT(bool box)> 
                 {[box] { return *box ? 1 : 0; }, [box](const int& i) { *box = i == 1; }},
                 KeyTexts({"IDS_QM_UI_HINGE_PREVIEW_WHOLE", "IDS_QM_UI_HINGE_PREVIEW_BOX"}))
         .name = "box";
-    return form.Picture([box, plot] { return plot(*box); });
+    CFormField& picture = form.Picture([box, plot] { return plot(*box); });
+    LeaveWidth(picture);
+    return picture;
 }

@@ -80,6 +80,9 @@ void AddCriteriaCells(CFormView& form, const T_BACKBONE_PAGE& page);
 /// Yield strengths, yield deformations and user stiffness of both sides.
 void AddYieldCells(CFormView& form, const T_BACKBONE_PAGE& page);
 
+/// On a small screen the fields beside a picture keep their width: it takes what is left.
+void LeaveWidth(CFormField& picture);
+
 /// The picture of a curve, with a choice between the whole curve and the small box.
 CFormField& AddBackbonePicture(CFormView& form, std::function<T_PLOT(bool box)> plot);
 

@@ -11,6 +11,7 @@ namespace {
 
 using zql::lib::MMSGFunction;
 using SURFACE = CPO_HingeYieldPropDlgNew;
+constexpr int kNumber = 70; // width of an edit field
 
 /// The findings of the form, kept for the cells of its grids.
 template <class DLG>
@@ -29,9 +30,13 @@ void AddStrengths(CFormView& form, SURFACE& dlg, const SURFACE::T_LEVEL& level)
 {
     const std::string prefix = level.names.prefix;
     const T_UNITS units = dlg.m_owner.units;
+    const auto wide = [](CFormField& field) -> CFormField& {
+        field.widget->setMinimumWidth(kNumber);
+        return field;
+    };
     const auto force = [&](const char* name, const char* field, double& value) {
         form.Note([=] { return HingeHead(name, kDimForce, units); });
-        form.Number(PlainLabel(name), Ref(value)).name = prefix + field;
+        wide(form.Number(PlainLabel(name), Ref(value))).name = prefix + field;
         form.Note(PlainLabel(""));
     };
     const auto moments = [&](bool aboutY, bool largest) {
@@ -43,8 +48,8 @@ void AddStrengths(CFormView& form, SURFACE& dlg, const SURFACE::T_LEVEL& level)
             prefix + (aboutY ? "y." : "z.") + (largest ? "momentMax." : "moment.");
         const auto used = [&dlg, aboutY] { return dlg.IsAxisUsed(aboutY); };
         Set(form.Note([=] { return HingeHead(name, kDimMoment, units); }), "", used);
-        Set(form.Number(PlainLabel(name + "(+)"), Ref(m.pos)), field + "pos", used);
-        Set(form.Number(PlainLabel(name + "(-)"), Ref(m.neg)), field + "neg", used);
+        Set(wide(form.Number(PlainLabel(name + "(+)"), Ref(m.pos))), field + "pos", used);
+        Set(wide(form.Number(PlainLabel(name + "(-)"), Ref(m.neg))), field + "neg", used);
     };
     form.Cells({{}, PlainLabel("(+)"), PlainLabel("(-)")});
     force(level.names.tension, "tension", level.level->tension);
@@ -85,13 +90,13 @@ void AddLevel(CFormView& form, SURFACE& dlg, const SURFACE::T_LEVEL& level,
     AddGrid(form, dlg, level, true, findings);
     AddGrid(form, dlg, level, false, findings);
     form.EndPages();
-    form.NextColumn();
-    form.Picture([&dlg, level] {
+    form.NextColumn(1);
+    LeaveWidth(form.Picture([&dlg, level] {
         return HingeInteractionPlot(
             dlg.m_owner.type, *level.level, MMSGFunction::GetValue(level.titleKey),
             dlg.LinesOf(*level.level),
             dlg.m_showValue ? std::optional(dlg.m_owner.units) : std::nullopt);
-    });
+    }));
     form.EndColumns();
 }
 
@@ -140,8 +145,8 @@ void BuildUserInteraction(CFormView& form, CPushOverPMMInteractionDlg& dlg)
     form.Flag(KeyText("IDS_QM_UI_HINGE_PM_BALANCED"), Ref(dlg.m_table.balanced)).name = "balanced";
     MarkedGrid(form, grid, findings, "").name = "curves";
     form.Note(KeyText("IDS_QM_UI_HINGE_PMM_NOTE"));
-    form.NextColumn();
-    form.Picture([&dlg] { return UserInteractionPlot(dlg.m_owner.type, dlg.m_table); });
+    form.NextColumn(1);
+    LeaveWidth(form.Picture([&dlg] { return UserInteractionPlot(dlg.m_owner.type, dlg.m_table); }));
     form.EndColumns();
 }
 

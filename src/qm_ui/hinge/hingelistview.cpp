@@ -50,7 +50,7 @@ void BuildTypeList(CFormView& form, CPO_HingeTypeListDlg& dlg)
         (void)dlg.OnModify();
         form.Refresh();
     };
-    form.Columns();
+    form.Columns(1);
     form.Grid(std::move(b)).name = "types";
     form.Note([&dlg] { return dlg.Description(); });
     form.NextColumn();

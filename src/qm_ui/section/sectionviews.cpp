@@ -11,7 +11,7 @@ namespace {
 
 using DLG = CSectionCurvesDlg;
 constexpr QSize kPicture{720, 440};
-constexpr int kCaption = 170, kField = 200; // widths: the pictures take the room that is left
+constexpr int kCaption = 145, kField = 250; // widths: the pictures take the room that is left
 
 /// A member of the options as a position in a list; a change calculates anew.
 template <class E>
@@ -102,7 +102,7 @@ void BuildCurves(CFormView& form, DLG& d)
     AddOptions(form, d);
     form.NextColumn(1);
     AddPage(form, d, SECTION_TASK::Curvature, "IDS_QM_PLOT_SECC_CURVATURE");
-    AddPage(form, d, SECTION_TASK::Interaction, "IDS_QM_PLOT_SECC_INTERACTION");
+    AddPage(form, d, SECTION_TASK::Interaction, "IDS_QM_UI_SECC_INTERACTION");
     AddPage(form, d, SECTION_TASK::Surface, "IDS_QM_UI_SECC_SURFACE");
     AddPage(form, d, SECTION_TASK::Capacity, "IDS_QM_PLOT_SECC_CAPACITY");
     form.EndPages();

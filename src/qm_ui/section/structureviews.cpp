@@ -167,12 +167,11 @@ T_GRID_BINDING BarGrid(CSectionDlg& d)
 void AddBars(CFormView& form, CSectionDlg& d)
 {
     form.Group(KeyText("IDS_QM_UI_SECT_LAY"));
-    form.Columns();
     form.Choice(KeyText("IDS_QM_UI_SECT_PLACE"), IndexRef(d.m_group.place),
                 KeyTexts({"IDS_QM_UI_BARS_CORNERS", "IDS_QM_UI_BARS_TOP", "IDS_QM_UI_BARS_BOTTOM",
                           "IDS_QM_UI_BARS_RIGHT", "IDS_QM_UI_BARS_LEFT", "IDS_QM_UI_BARS_AROUND"}))
         .name = "place";
-    form.NextColumn();
+    form.Columns();
     CFormField& count = form.Integer(KeyText("IDS_QM_UI_SECT_COUNT"), Ref(d.m_group.count));
     count.name = "count";
     count.enabled = [&d] { return d.m_group.place != BAR_PLACE::Corners; };
