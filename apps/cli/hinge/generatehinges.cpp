@@ -58,14 +58,8 @@ std::string TraceText(const T_CODE_HINGES& hinges, const T_UNITS& units)
                     Say("IDS_QM_GEN_TRACE", element->hinge->type.name, row.end,
                         kComponentNames[static_cast<std::size_t>(row.component)], row.side) +
                     "\n";
-            for (const T_CODE_TRACE& line : row.of->trace) {
-                const std::string unit = UnitText(line.dim, units);
-                text += "  " + line.symbol + " = " + Number(FromSi(line.value, units, line.dim)) +
-                        (unit.empty() ? "" : " " + unit);
-                for (const std::string& part : {line.clause, line.text, MarkText(line.mark)})
-                    if (!part.empty()) text += "; " + part;
-                text += "\n";
-            }
+            for (const T_CODE_TRACE& line : row.of->trace)
+                text += "  " + TraceLine(line, units) + "\n";
         }
     return text;
 }

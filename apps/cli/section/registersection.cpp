@@ -1,7 +1,7 @@
 // The arguments of the commands on the curves of sections.
 #include "registershared.h"
 #include "registrations.h"
-#include "section/sectioncommands.h"
+#include "section/sectioncheckcommand.h"
 #include "section/sectionlibrary.h"
 
 namespace {
@@ -65,6 +65,28 @@ void AddTask(const T_GROUP& group, SECTION_TASK task, const char* help, const ch
     AddOverwrite(sub, o->overwrite);
 }
 
+void AddCheck(const T_GROUP& group)
+{
+    const auto o = std::make_shared<T_SECTION_CHECK_COMMAND>();
+    auto* sub = AddOne(group, "check", Say("IDS_QM_HELP_SECK"),
+                       " --section \"column 40x40\" --axial 400 800 --my 100 --mz 50 --vz 80", o,
+                       RunSectionCheck);
+    AddStrengths(sub, *o);
+    constexpr std::array<const char*, 6> kHelp{"IDS_QM_HELP_SECK_AXIAL", "IDS_QM_HELP_SECK_MY",
+                                               "IDS_QM_HELP_SECK_MZ",    "IDS_QM_HELP_SECK_VY",
+                                               "IDS_QM_HELP_SECK_VZ",    "IDS_QM_HELP_SECK_T"};
+    for (std::size_t i = 0; i < kHelp.size(); ++i)
+        sub->add_option(std::string("--") + kSectionForceNames[i], o->forces[i], Say(kHelp[i]));
+    sub->add_option("--code", o->codes, Say("IDS_QM_HELP_SECK_CODE"))
+        ->check(OneOf(kSectionCheckCodeNames));
+    sub->add_option("--cot-theta", o->cotTheta, Say("IDS_QM_HELP_SECK_COT"));
+    sub->add_flag("--trace", o->trace, Say("IDS_QM_HELP_HINGE_TRACE"));
+    AddJson(sub, o->json);
+    sub->add_option("--csv", o->csv, Say("IDS_QM_HELP_SECK_CSV"));
+    sub->add_option("--sheet", o->sheet, Say("IDS_QM_HELP_SECK_SHEET"));
+    AddOverwrite(sub, o->overwrite);
+}
+
 void AddLibrary(CLI::App* section, EXIT_CODE& code)
 {
     auto* shapes = section->add_subcommand("shapes", Say("IDS_QM_HELP_SECC_SHAPES"));
@@ -93,6 +115,7 @@ void AddSection(CLI::App& app, EXIT_CODE& code)
             " --section \"column 40x40\" --values design");
     AddTask(group, SECTION_TASK::Surface, "IDS_QM_HELP_SECC_SURFACE",
             " --section \"column 40x40\" --axial 0 400 800 --json -");
+    AddCheck(group);
     AddLibrary(section, code);
     AddSectionBars(*section, code);
 }

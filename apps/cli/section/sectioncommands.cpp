@@ -30,10 +30,7 @@ T_SECTION_REQUEST RequestOf(const T_SECTION_COMMAND& c, const T_UNITS& units)
 {
     T_SECTION_REQUEST r;
     r.task = c.task;
-    r.options = c.options;
-    r.options.values = NamedIn<SECTION_VALUES>(kSectionValueNames, c.values);
-    r.options.law = NamedIn<SECTION_LAW>(kSectionLawNames, c.law);
-    r.options.core = NamedIn<SECTION_CORE>(kSectionCoreNames, c.confined);
+    r.options = SectionOptionsOf(c);
     if (!c.directions.empty()) r.directions.clear();
     for (const double degrees : c.directions)
         r.directions.push_back(degrees * std::numbers::pi / 180.0);
@@ -62,25 +59,6 @@ EXIT_CODE PairsOf(const T_MODEL& model, const T_SECTION_COMMAND& c, const std::s
     return out.size() > before
                ? EXIT_CODE::Done
                : Complain(EXIT_CODE::Usage, c.file + ": " + Say("IDS_QM_SECC_UNUSED", name));
-}
-
-EXIT_CODE FindPairs(const T_MODEL& model, const T_SECTION_COMMAND& c,
-                    std::vector<T_SECTION_PAIR>& out)
-{
-    int material = 0;
-    if (!c.material.empty() && !(material = MaterialKey(model, c.material)))
-        return Complain(EXIT_CODE::Usage,
-                        c.file + ": " + Say("IDS_QM_SECC_NO_MATERIAL", c.material));
-    for (const std::string& name : c.sections)
-        if (const EXIT_CODE code = PairsOf(model, c, name, material, out); code != EXIT_CODE::Done)
-            return code;
-    if (c.sections.empty()) {
-        out = SectionPairs(model);
-        if (material)
-            std::erase_if(out, [&](const T_SECTION_PAIR& p) { return p.material != material; });
-    }
-    return out.empty() ? Complain(EXIT_CODE::BadInput, c.file + ": " + Say("IDS_QM_SECC_NONE"))
-                       : EXIT_CODE::Done;
 }
 
 void AppendTable(const T_TEXT_TABLE& table, std::string& text)
@@ -142,6 +120,34 @@ EXIT_CODE WriteAll(const T_SECTION_COMMAND& c, const std::vector<T_SECTION_ANSWE
 
 } // namespace
 
+T_SECTION_OPTIONS SectionOptionsOf(const T_SECTION_COMMAND& c)
+{
+    T_SECTION_OPTIONS o = c.options;
+    o.values = NamedIn<SECTION_VALUES>(kSectionValueNames, c.values);
+    o.law = NamedIn<SECTION_LAW>(kSectionLawNames, c.law);
+    o.core = NamedIn<SECTION_CORE>(kSectionCoreNames, c.confined);
+    return o;
+}
+
+EXIT_CODE FindSectionPairs(const T_MODEL& model, const T_SECTION_COMMAND& c,
+                           std::vector<T_SECTION_PAIR>& out)
+{
+    int material = 0;
+    if (!c.material.empty() && !(material = MaterialKey(model, c.material)))
+        return Complain(EXIT_CODE::Usage,
+                        c.file + ": " + Say("IDS_QM_SECC_NO_MATERIAL", c.material));
+    for (const std::string& name : c.sections)
+        if (const EXIT_CODE code = PairsOf(model, c, name, material, out); code != EXIT_CODE::Done)
+            return code;
+    if (c.sections.empty()) {
+        out = SectionPairs(model);
+        if (material)
+            std::erase_if(out, [&](const T_SECTION_PAIR& p) { return p.material != material; });
+    }
+    return out.empty() ? Complain(EXIT_CODE::BadInput, c.file + ": " + Say("IDS_QM_SECC_NONE"))
+                       : EXIT_CODE::Done;
+}
+
 EXIT_CODE RunSection(const T_SECTION_COMMAND& c)
 {
     if (const EXIT_CODE code = CheckPlotName(c.plot); code != EXIT_CODE::Done) return code;
@@ -158,7 +164,8 @@ EXIT_CODE RunSection(const T_SECTION_COMMAND& c)
     const T_MODEL& model = doc.Data().Model();
     const T_UNITS units = doc.Unit().Units();
     std::vector<T_SECTION_PAIR> pairs;
-    if (const EXIT_CODE code = FindPairs(model, c, pairs); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = FindSectionPairs(model, c, pairs); code != EXIT_CODE::Done)
+        return code;
     if (!c.plot.empty() && pairs.size() > 1)
         return Complain(EXIT_CODE::Usage, Say("IDS_QM_SECC_ONE_PICTURE"));
     const T_SECTION_REQUEST request = RequestOf(c, units);

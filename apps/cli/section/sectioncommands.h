@@ -24,6 +24,11 @@ struct T_SECTION_COMMAND {
     bool overwrite = false;
 };
 
+T_SECTION_OPTIONS SectionOptionsOf(const T_SECTION_COMMAND& command);
+/// The sections that are meant, with their materials. Usage and BadInput are told.
+EXIT_CODE FindSectionPairs(const T_MODEL& model, const T_SECTION_COMMAND& command,
+                           std::vector<T_SECTION_PAIR>& out);
+
 /// Calculates and prints. BadInput with the first section that has no answer, nothing written.
 EXIT_CODE RunSection(const T_SECTION_COMMAND& command);
 

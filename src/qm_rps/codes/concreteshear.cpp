@@ -20,15 +20,16 @@ bool Sound(const T_SHEAR_SECTION& s, CCodeSheet& sheet)
 }
 
 /// 6.2.2, MPa and mm; stresses in Pa out.
-double EnConcreteStress(const T_SHEAR_SECTION& s, double gammaC, CCodeSheet& sheet)
+double EnConcreteStress(const T_SHEAR_SECTION& s, const T_EN_SHEAR_OPTIONS& o, CCodeSheet& sheet)
 {
     const double fck = s.fc / kPascalsPerMpa;
     const double k =
         sheet.Put("k", std::min(2.0, 1.0 + std::sqrt(0.2 / s.d)), kEn, "1 + sqrt(200/d) <= 2", S2);
     const double rho = sheet.Put("rho_l", std::min(0.02, s.tensionRatio), kEn, "<= 0.02", S2);
-    const double axial = std::min(s.axial / s.Ag, 0.2 * s.fc / gammaC) / kPascalsPerMpa;
+    const double axial =
+        std::min(s.axial / s.Ag, 0.2 * o.alphaCc * s.fc / o.gammaC) / kPascalsPerMpa;
     sheet.Put("s_cp", axial * kPascalsPerMpa, kDimStress, kEn, "N/Ac <= 0.2 fcd", S2);
-    const double formula = 0.18 / gammaC * k * std::cbrt(100.0 * rho * fck);
+    const double formula = 0.18 / o.gammaC * k * std::cbrt(100.0 * rho * fck);
     const double least = 0.035 * std::pow(k, 1.5) * std::sqrt(fck);
     return std::max(0.0, std::max(formula, least) + 0.15 * axial) * kPascalsPerMpa;
 }
@@ -40,10 +41,11 @@ std::optional<T_EN_SHEAR> EnShear(const T_SHEAR_SECTION& s, const T_EN_SHEAR_OPT
 {
     sheet.Positive({{"gammaC", options.gammaC}, {"gammaS", options.gammaS}});
     sheet.Within("cotTheta", options.cotTheta, 1.0, 2.5);
+    sheet.Within("alphaCc", options.alphaCc, 0.5, 1.0);
     if (!Sound(s, sheet)) return {};
     T_EN_SHEAR v;
     v.concrete =
-        sheet.Put("VRd,c", EnConcreteStress(s, options.gammaC, sheet) * s.bw * s.d, kDimForce, kEn,
+        sheet.Put("VRd,c", EnConcreteStress(s, options, sheet) * s.bw * s.d, kDimForce, kEn,
                   "max(0.18/gc k (100 rho_l fck)^(1/3); 0.035 k^1.5 fck^0.5) bw d"
                   " + 0.15 s_cp bw d",
                   S2);
@@ -51,7 +53,8 @@ std::optional<T_EN_SHEAR> EnShear(const T_SHEAR_SECTION& s, const T_EN_SHEAR_OPT
     if (!(s.legArea > 0.0)) return sheet.Sound() ? std::optional(v) : std::nullopt;
 
     const double z = 0.9 * s.d, cot = options.cotTheta;
-    const double fcd = s.fc / options.gammaC, ratio = std::max(0.0, s.axial) / s.Ag / fcd;
+    const double fcd = options.alphaCc * s.fc / options.gammaC,
+                 ratio = std::max(0.0, s.axial) / s.Ag / fcd;
     const double chord = ratio <= 0.25  ? 1.0 + ratio
                          : ratio <= 0.5 ? 1.25
                                         : std::max(0.0, 2.5 * (1.0 - ratio));

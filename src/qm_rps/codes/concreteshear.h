@@ -22,6 +22,7 @@ struct T_EN_SHEAR_OPTIONS {
     double gammaC = 1.5, gammaS = 1.15;
     double cotTheta = 1.0;
     bool addConcrete = false; // NTC, existing members: VRd = min(VRd,c + VRd,s; VRd,max)
+    double alphaCc = 1.0;     // 3.1.6, of fcd
 };
 std::optional<T_EN_SHEAR> EnShear(const T_SHEAR_SECTION& s, const T_EN_SHEAR_OPTIONS& options,
                                   CCodeSheet& sheet);

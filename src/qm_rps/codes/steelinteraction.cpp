@@ -1,6 +1,7 @@
 #include "qm_rps/codes/steelinteraction.h"
 
 #include <algorithm>
+#include <array>
 #include <cmath>
 #include <numbers>
 
@@ -12,6 +13,20 @@ constexpr auto R = CODE_MARK::Recalled;
 constexpr const char* kShear = "EN 1993-1-1 6.2.6";
 constexpr const char* kCombined = "EN 1993-1-1 6.2.9.1";
 constexpr const char* kAisc = "AISC 360 H1-1";
+
+// AISC 360 Table B4.1: limits of b/t over sqrt(E/Fy), of tubes D/t over E/Fy. Flanges welded to a
+// web: 0.64 sqrt(kc) with the least kc, 0.35. Of a box either pair of plates may be the flanges.
+struct T_SLENDER_ROW {
+    STEEL_SHAPE shape;
+    double slenderFlange, slenderWeb; // uniform compression
+    double compactFlange, compactWeb; // bending
+};
+constexpr std::array<T_SLENDER_ROW, 4> kSlender{{
+    {STEEL_SHAPE::RolledI, 0.56, 1.49, 0.38, 3.76},
+    {STEEL_SHAPE::WeldedI, 0.378, 1.49, 0.38, 3.76},
+    {STEEL_SHAPE::RectangularTube, 1.40, 1.40, 1.12, 1.12},
+    {STEEL_SHAPE::CircularTube, 0.11, 0.11, 0.07, 0.07},
+}};
 
 bool IsI(STEEL_SHAPE shape)
 {
@@ -158,6 +173,42 @@ std::optional<double> AiscShear(double d, double h, double tw, double Fy, double
     const double cv = sheet.Put("Cv1", std::min(1.0, limit / slenderness), kClause,
                                 "1; h/tw > 1.10 sqrt(kv E/Fy): 1.10 sqrt(kv E/Fy)/(h/tw)", R);
     return sheet.Put("Vn", 0.6 * Fy * d * tw * cv, kDimForce, kClause, "0.6 Fy Aw Cv1", R);
+}
+
+std::optional<double> AiscShapeShear(const T_STEEL_SHAPE& s, bool alongDepth, double Fy, double E,
+                                     CCodeSheet& sheet)
+{
+    if (!Sound(s, sheet)) return {};
+    if (!IsI(s.shape)) {
+        sheet.Refuse(CODE_REASON::NoRow, "shape", "AISC 360 G2.1 (I)");
+        return {};
+    }
+    if (alongDepth) return AiscShear(s.h, s.h - 2.0 * (s.tf + s.r), s.tw, Fy, E, sheet);
+    return sheet.Put("Vn", 0.6 * Fy * 2.0 * s.b * s.tf, kDimForce, "AISC 360 G6", "0.6 Fy 2 bf tf",
+                     R);
+}
+
+bool AiscPlastic(const T_STEEL_SHAPE& s, double Fy, double E, bool compressed, bool bent,
+                 CCodeSheet& sheet)
+{
+    constexpr const char* kTable = "AISC 360 Table B4.1";
+    if (!Sound(s, sheet) || !sheet.Positive({{"Fy", Fy}, {"E", E}})) return false;
+    const auto row = std::ranges::find(kSlender, s.shape, &T_SLENDER_ROW::shape);
+    const bool tube = s.shape == STEEL_SHAPE::CircularTube;
+    const double unit = tube ? E / Fy : std::sqrt(E / Fy);
+    const auto judge = [&](const char* symbol, double ratio, double slender, double compact) {
+        const double limit = unit * (bent && compressed ? std::min(slender, compact)
+                                     : bent             ? compact
+                                                        : slender);
+        sheet.Put(symbol, ratio, kTable, "<= " + CodeNumber(limit), R);
+        return sheet.Within(symbol, ratio, 0.0, limit);
+    };
+    if (tube) return judge("D/t", s.h / s.tw, row->slenderFlange, row->compactFlange);
+    const bool box = s.shape == STEEL_SHAPE::RectangularTube;
+    const double flange = box ? (s.b - 2.0 * (s.tw + s.r)) / s.tf : s.b / (2.0 * s.tf);
+    const double web = (s.h - 2.0 * (s.tf + s.r)) / s.tw;
+    return judge("b/t (flange)", flange, row->slenderFlange, row->compactFlange) &&
+           judge("h/t (web)", web, row->slenderWeb, row->compactWeb);
 }
 
 std::optional<double> WideFlangeSurface(double p, double my, double mz, CCodeSheet& sheet)

@@ -45,6 +45,14 @@ std::optional<double> AiscInteraction(const T_STEEL_PLASTIC_STRENGTH& available,
 /// web depth.
 std::optional<double> AiscShear(double d, double h, double tw, double Fy, double E,
                                 CCodeSheet& sheet);
+/// Of an I along its web (G2.1), or of its flanges across it (G6). Refuses other shapes.
+std::optional<double> AiscShapeShear(const T_STEEL_SHAPE& s, bool alongDepth, double Fy, double E,
+                                     CCodeSheet& sheet);
+
+/// AISC 360 Table B4.1: the section reaches A Fy (`compressed`: no slender plate) and Z Fy (`bent`:
+/// all are compact). False: the sheet says which plate is too slender.
+bool AiscPlastic(const T_STEEL_SHAPE& s, double Fy, double E, bool compressed, bool bent,
+                 CCodeSheet& sheet);
 
 /// Plastic strength of W-shapes (McGuire, Gallagher, Ziemian): p, my (major), mz (minor) over the
 /// plastic values; 1 on the surface.

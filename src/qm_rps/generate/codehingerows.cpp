@@ -172,6 +172,16 @@ std::string MarkText(CODE_MARK mark)
     return Say(kKeys[static_cast<std::size_t>(mark)]);
 }
 
+std::string TraceLine(const T_CODE_TRACE& line, const T_UNITS& units)
+{
+    const std::string unit = UnitText(line.dim, units);
+    std::string text = line.symbol + " = " + Digits(FromSi(line.value, units, line.dim)) +
+                       (unit.empty() ? "" : " " + unit);
+    for (const std::string& part : {line.clause, line.text, MarkText(line.mark)})
+        if (!part.empty()) text += "; " + part;
+    return text;
+}
+
 std::string UnitText(T_DIM dim, const T_UNITS& units)
 {
     std::string over = dim.force > 0 ? Power(NameOf(units.force), dim.force) : "";

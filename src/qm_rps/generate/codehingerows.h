@@ -28,5 +28,7 @@ HingeWarnings(const T_CODE_HINGES& hinges);
 
 /// "computed", "sighted twice" ...
 std::string MarkText(CODE_MARK mark);
+/// "theta_y = 0.0051; EN 1998-3 (A.10b); ...; sighted once".
+std::string TraceLine(const T_CODE_TRACE& line, const T_UNITS& units);
 /// "kN m", "kN/m2", "1/m"; empty: without a unit.
 std::string UnitText(T_DIM dim, const T_UNITS& units);

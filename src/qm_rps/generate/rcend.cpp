@@ -77,15 +77,17 @@ std::optional<T_EN_MEMBER> EnMember(const T_RC_BASIS& in, CCodeSheet& sheet)
     return m;
 }
 
+T_SHEAR_SECTION ShearSectionOf(const T_RC_BENDING& s, double fc, double fyw, double axial)
+{
+    const double width = s.round ? s.area / s.d : s.b;
+    return {width, s.d, s.area, fc, fyw, s.As / (width * s.d), axial, s.shear, s.spacing};
+}
+
 std::optional<T_EN_SHEAR> EnMonotonicShear(const T_RC_BASIS& in, const T_RC_MATERIAL& material,
                                            CCodeSheet& sheet)
 {
-    const T_RC_BENDING& s = in.section;
-    const double width = s.round ? s.area / s.d : s.b; // bw d is the area of a circle
-    const T_SHEAR_SECTION shear{width,       s.d,          s.area,
-                                material.fc, material.fyw, s.As / (width * s.d),
-                                in.axial,    s.shear,      s.spacing};
-    return EnShear(shear, {1.0, 1.0, 1.0, false}, sheet);
+    return EnShear(ShearSectionOf(in.section, material.fc, material.fyw, in.axial),
+                   {1.0, 1.0, 1.0, false}, sheet);
 }
 
 std::optional<T_ACI_SHEAR> AsceBeamShear(const T_RC_BASIS& in, const T_RC_MATERIAL& material,

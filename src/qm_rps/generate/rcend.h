@@ -22,6 +22,8 @@ std::string ReasonOf(const CCodeSheet& sheet);
 
 /// EN 1998-3, Circolare: the member as their formulas take it.
 std::optional<T_EN_MEMBER> EnMember(const T_RC_BASIS& in, CCodeSheet& sheet);
+/// The side as the rules of shear take it; of a circle bw d is its area.
+T_SHEAR_SECTION ShearSectionOf(const T_RC_BENDING& section, double fc, double fyw, double axial);
 /// EN 1992-1-1 6.2 with the strengths of `material`, 45 degrees.
 std::optional<T_EN_SHEAR> EnMonotonicShear(const T_RC_BASIS& in, const T_RC_MATERIAL& material,
                                            CCodeSheet& sheet);

@@ -42,9 +42,7 @@ std::optional<double> ShearStrength(const T_STEEL_BASIS& in, CCodeSheet& sheet)
         const auto area = EnShearArea(s, in.end.aboutY, sheet);
         return area ? EnPlasticShear(*area, in.fy, sheet) : std::nullopt;
     }
-    if (in.end.aboutY) return AiscShear(s.h, s.h - 2.0 * (s.tf + s.r), s.tw, in.fy, in.E, sheet);
-    return sheet.Put("Vn", 0.6 * in.fy * 2.0 * s.b * s.tf, kDimForce, "AISC 360 G6",
-                     "0.6 Fy 2 bf tf", R);
+    return AiscShapeShear(s, in.end.aboutY, in.fy, in.E, sheet);
 }
 
 std::optional<T_CODE_BACKBONE> AsceBending(const T_STEEL_BASIS& in, const T_CODE_SIDE& side,

@@ -37,15 +37,19 @@ std::optional<double> Yield(const T_MEMBER_END& end, double& lower, CCodeSheet& 
                      "Fy x " + CodeNumber(factor), CODE_MARK::Recalled);
 }
 
-/// The dimensions of the section, sharp corners.
-std::optional<T_STEEL_SHAPE> ShapeOf(const T_SECT_D& s, CCodeSheet& sheet)
+} // namespace
+
+std::optional<T_STEEL_SHAPE> SteelShapeOf(const T_SECT_D& s, bool fillets, CCodeSheet& sheet)
 {
     const auto& [a, b, c, d] = s.size;
+    const double r = fillets ? s.fillet : 0.0;
     switch (s.shape) {
     case SECT_SHAPE::IShape:
-        return T_STEEL_SHAPE{STEEL_SHAPE::WeldedI, s.area, a, b, d, c, 0.0};
+        return T_STEEL_SHAPE{
+            r > 0.0 ? STEEL_SHAPE::RolledI : STEEL_SHAPE::WeldedI, s.area, a, b, d, c, r};
     case SECT_SHAPE::Box:
-        return T_STEEL_SHAPE{STEEL_SHAPE::RectangularTube, s.area, a, b, d, c, 0.0};
+        return T_STEEL_SHAPE{STEEL_SHAPE::RectangularTube,  s.area, a, b, d, c,
+                             fillets ? InnerRadius(s) : 0.0};
     case SECT_SHAPE::Pipe:
         return T_STEEL_SHAPE{STEEL_SHAPE::CircularTube, s.area, a, a, b, b, 0.0};
     default:
@@ -53,8 +57,6 @@ std::optional<T_STEEL_SHAPE> ShapeOf(const T_SECT_D& s, CCodeSheet& sheet)
         return {};
     }
 }
-
-} // namespace
 
 T_STEEL_MEMBER T_STEEL_BASIS::Member() const
 {
@@ -78,7 +80,7 @@ std::optional<T_STEEL_BASIS> SteelBasis(const T_MEMBER_END& end, CCodeSheet& she
 {
     double lower = 0.0;
     const std::optional<double> fy = Yield(end, lower, sheet);
-    const auto shape = fy ? ShapeOf(end.section, sheet) : std::nullopt;
+    const auto shape = fy ? SteelShapeOf(end.section, false, sheet) : std::nullopt;
     const T_SECT_D& s = end.section;
     if (!shape || !sheet.Positive({{"E", end.material.E}, {"clear length", end.clear}})) return {};
     T_STEEL_BASIS in{end, *shape, {s.area * *fy, s.Zy * *fy, s.Zz * *fy}, *fy, lower};

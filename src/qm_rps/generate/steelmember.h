@@ -21,6 +21,9 @@ struct T_STEEL_BASIS {
     T_STEEL_MEMBER Member() const;
 };
 
+/// I, box or pipe; other shapes are refused. Without `fillets` the plates count as welded.
+std::optional<T_STEEL_SHAPE> SteelShapeOf(const T_SECT_D& section, bool fillets, CCodeSheet& sheet);
+
 /// Plates are taken as welded, without fillets. ASCE 41: the material's mean, else Fy times the
 /// factor of Table 9-3. EN 1998-3, Circolare: the mean, else Fy with a warning, over the confidence
 /// factor. Refuses other shapes and materials.

@@ -16,6 +16,20 @@ std::string Quoted(const std::string& text)
 
 } // namespace
 
+void AppendOfSection(const std::string& section, const std::string& material,
+                     const T_TEXT_TABLE& one, T_TEXT_TABLE& all)
+{
+    if (all.columns.empty()) {
+        all.columns = {{Say("IDS_QM_UI_HEAD_SECTION")}, {Say("IDS_QM_UI_HEAD_MATERIAL")}};
+        all.columns.insert(all.columns.end(), one.columns.begin(), one.columns.end());
+    }
+    for (const std::vector<std::string>& cells : one.rows) {
+        std::vector<std::string>& row = all.rows.emplace_back();
+        row = {section, material};
+        row.insert(row.end(), cells.begin(), cells.end());
+    }
+}
+
 T_TEXT_TABLE SectionExport(const std::vector<T_SECTION_ANSWER>& answers, const T_UNITS& units)
 {
     T_TEXT_TABLE all;
@@ -23,15 +37,7 @@ T_TEXT_TABLE SectionExport(const std::vector<T_SECTION_ANSWER>& answers, const T
         const T_TEXT_TABLE one = answer.task == SECTION_TASK::Capacity
                                      ? SectionStates(answer, units)
                                      : SectionPoints(answer, units);
-        if (all.columns.empty()) {
-            all.columns = {{Say("IDS_QM_UI_HEAD_SECTION")}, {Say("IDS_QM_UI_HEAD_MATERIAL")}};
-            all.columns.insert(all.columns.end(), one.columns.begin(), one.columns.end());
-        }
-        for (const std::vector<std::string>& cells : one.rows) {
-            std::vector<std::string>& row = all.rows.emplace_back();
-            row = {answer.section, answer.material};
-            row.insert(row.end(), cells.begin(), cells.end());
-        }
+        AppendOfSection(answer.section, answer.material, one, all);
     }
     return all;
 }

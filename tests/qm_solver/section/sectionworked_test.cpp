@@ -85,7 +85,10 @@ TEST(SectionWorked, AciInclinedAxisAndBeamOfTheTextbook)
     const double c = 8 * (std::sin(pi / 6) + std::cos(pi / 6)) + 2.0 * std::cos(pi / 6);
     EXPECT_NEAR(12.66, c, 5e-3);
     const T_CAPACITY p = CapacityAt(s, -pi / 6, c / depth);
-    EXPECT_NEAR(485, p.axial, 4.85);
+    EXPECT_NEAR(485, p.axial, 4.85); // the sum of rounded forces; the others to their digits
+    EXPECT_NEAR(2370, p.My, 5);
+    EXPECT_NEAR(-1150, p.Mz, 5);
+    EXPECT_NEAR(-0.0014, p.plane.axial - 5.6 * p.plane.overZ + 5.6 * p.plane.overY, 5e-5);
     EXPECT_NEAR(485.658, p.axial, 1e-3);
     EXPECT_NEAR(2366.09, p.My, 1e-2);
     EXPECT_NEAR(-1145.96, p.Mz, 1e-2);

@@ -1,0 +1,181 @@
+#include "section/sectioncheckcommand.h"
+
+#include "console/tabletext.h"
+#include "inputfile.h"
+#include "output.h"
+#include "qm_base/say.h"
+#include "qm_rps/section/sectionchecktable.h"
+#include "qm_rps/section/sectionexport.h"
+#include "json/tracejson.h"
+
+#include <algorithm>
+#include <cstdio>
+
+namespace {
+
+constexpr std::array<T_DIM, 6> kDims{kDimForce, kDimMoment, kDimMoment,
+                                     kDimForce, kDimForce,  kDimMoment};
+constexpr std::array<const char*, 6> kKeys{"N", "My", "Mz", "Vy", "Vz", "T"};
+
+std::array<double*, 6> ForcesOf(T_SECTION_FORCES& f)
+{
+    return {&f.N, &f.My, &f.Mz, &f.Vy, &f.Vz, &f.T};
+}
+
+/// A set for each value of the longest list; lists of another length than that and 1 are refused.
+EXIT_CODE ReadForces(const T_SECTION_CHECK_COMMAND& c, const T_UNITS& units,
+                     std::vector<T_SECTION_FORCES>& out)
+{
+    const std::size_t count = std::ranges::max(c.forces, {}, &std::vector<double>::size).size();
+    for (std::size_t k = 0; k < c.forces.size(); ++k) {
+        const std::size_t size = c.forces[k].size();
+        if (size > 1 && size != count)
+            return Complain(EXIT_CODE::Usage,
+                            Say("IDS_QM_SECK_SETS", std::string("--") + kSectionForceNames[k],
+                                std::to_string(size), std::to_string(count)));
+    }
+    for (std::size_t i = 0; i < count; ++i) {
+        const std::array<double*, 6> forces = ForcesOf(out.emplace_back());
+        for (std::size_t k = 0; k < forces.size(); ++k)
+            if (const std::vector<double>& list = c.forces[k]; !list.empty())
+                *forces[k] = ToSi(list[list.size() > 1 ? i : 0], units, kDims[k]);
+    }
+    return EXIT_CODE::Done;
+}
+
+void WriteWay(CJsonText& w, const T_SECTION_WAY& way, const T_UNITS& units)
+{
+    w.Object();
+    w.Member("checked", kSectionCheckedNames[static_cast<std::size_t>(way.what)]);
+    w.Member("by", way.by.empty() ? std::string("section calculator") : way.by);
+    w.Member("ratio", way.ratio);
+    w.Member("verdict", !way.ratio ? "not checked" : *way.ratio > 1.0 ? "exceeded" : "kept");
+    if (!way.ratio) w.Member("reason", way.reason);
+    WriteTrace(w, "trace", way.trace, units);
+    WriteWarnings(w, way.warnings);
+    w.End();
+}
+
+void WriteSet(CJsonText& w, T_SECTION_CHECKS set, const T_UNITS& units)
+{
+    w.Object();
+    w.Key("forces").Object(kJsonOneLine);
+    const std::array<double*, 6> forces = ForcesOf(set.forces);
+    for (std::size_t k = 0; k < forces.size(); ++k)
+        w.Member(kKeys[k], FromSi(*forces[k], units, kDims[k]));
+    w.End();
+    w.Key("ways").List();
+    for (const T_SECTION_WAY& way : set.ways)
+        WriteWay(w, way, units);
+    w.End();
+    w.End();
+}
+
+std::string CheckJson(const std::vector<T_SECTION_CHECK>& checks, const T_UNITS& units)
+{
+    CJsonText w(JSON_REALS::Shortest);
+    w.Object();
+    w.Key("units").Object(kJsonOneLine);
+    w.Member("force", NameOf(units.force)).Member("length", NameOf(units.length));
+    w.End();
+    w.Member("task", "check");
+    w.Key("sections").List();
+    for (const T_SECTION_CHECK& check : checks) {
+        w.Object();
+        w.Member("section", check.section).Member("material", check.material);
+        w.Member("values", kSectionValueNames[static_cast<std::size_t>(check.options.values)]);
+        WriteTrace(w, "trace", check.trace, units);
+        WriteWarnings(w, check.warnings);
+        w.Key("sets").List();
+        for (const T_SECTION_CHECKS& set : check.sets)
+            WriteSet(w, set, units);
+        w.End();
+        w.End();
+    }
+    w.End();
+    w.End();
+    return w.Text();
+}
+
+std::string Text(const T_SECTION_CHECK& check, bool trace, const T_UNITS& units)
+{
+    std::string text;
+    for (const std::string& line : SectionCheckHead(check, units))
+        text += line + "\n";
+    const T_TEXT_TABLE table = SectionCheckTable(check, units);
+    T_TABLE_ROWS rows(1);
+    for (const T_TEXT_COLUMN& column : table.columns)
+        rows.front().push_back(column.head);
+    rows.insert(rows.end(), table.rows.begin(), table.rows.end());
+    text += TableText(rows);
+    if (trace)
+        for (const std::string& line : SectionCheckTrace(check, units))
+            text += line + "\n";
+    return text + "\n";
+}
+
+EXIT_CODE WriteAll(const T_SECTION_CHECK_COMMAND& c, const std::vector<T_SECTION_CHECK>& checks,
+                   const T_UNITS& units)
+{
+    EXIT_CODE code = EXIT_CODE::Done;
+    if (!c.json.empty()) code = WriteOutput(c.json, CheckJson(checks, units));
+    if (code == EXIT_CODE::Done && !c.csv.empty())
+        code = WriteOutput(c.csv, TableCsv(SectionCheckExport(checks, units)));
+    if (code != EXIT_CODE::Done || c.sheet.empty()) return code;
+    T_FILE_ERROR error;
+    return WriteSheet(c.sheet, TableSheet(SectionCheckExport(checks, units)), error)
+               ? EXIT_CODE::Done
+               : ReportFileError(error);
+}
+
+T_SECTION_CHECK_REQUEST RequestOf(const T_SECTION_CHECK_COMMAND& c)
+{
+    T_SECTION_CHECK_REQUEST request;
+    request.options = SectionOptionsOf(c);
+    request.cotTheta = c.cotTheta;
+    for (const std::string& code : c.codes)
+        request.codes.push_back(static_cast<SECTION_CHECK_CODE>(
+            std::ranges::find(kSectionCheckCodeNames, code) - kSectionCheckCodeNames.begin()));
+    return request;
+}
+
+} // namespace
+
+EXIT_CODE RunSectionCheck(const T_SECTION_CHECK_COMMAND& c)
+{
+    if (const EXIT_CODE code = CheckOutputs(c.file,
+                                            {{c.json, OUTPUT_KIND::Json},
+                                             {c.csv, OUTPUT_KIND::Text},
+                                             {c.sheet, OUTPUT_KIND::Sheet}},
+                                            c.overwrite);
+        code != EXIT_CODE::Done)
+        return code;
+    CDBDoc doc;
+    if (const EXIT_CODE code = OpenInput(doc, c.file); code != EXIT_CODE::Done) return code;
+    const T_MODEL& model = doc.Data().Model();
+    const T_UNITS units = doc.Unit().Units();
+    std::vector<T_SECTION_PAIR> pairs;
+    if (const EXIT_CODE code = FindSectionPairs(model, c, pairs); code != EXIT_CODE::Done)
+        return code;
+    T_SECTION_CHECK_REQUEST request = RequestOf(c);
+    if (const EXIT_CODE code = ReadForces(c, units, request.forces); code != EXIT_CODE::Done)
+        return code;
+    std::vector<T_SECTION_CHECK> checks;
+    for (const T_SECTION_PAIR& pair : pairs) {
+        const T_SECT_D& section = model.sections.at(pair.section);
+        const T_MATL_D& material = model.materials.at(pair.material);
+        std::string why;
+        if (!CheckSection(section, material, request, units, checks.emplace_back(), why))
+            return Complain(EXIT_CODE::BadInput,
+                            c.file + ": " +
+                                Say("IDS_QM_SECC_IN", section.name, material.name, why));
+    }
+    if (c.json != "-" && c.csv != "-") {
+        std::string text;
+        for (const T_SECTION_CHECK& check : checks)
+            text += Text(check, c.trace, units);
+        text += Say("IDS_QM_SECK_SIGNS") + "\n";
+        std::fwrite(text.data(), 1, text.size(), stdout);
+    }
+    return WriteAll(c, checks, units);
+}

@@ -1,0 +1,18 @@
+// The command that checks sections for given forces.
+#pragma once
+
+#include "qm_rps/section/sectioncheck.h"
+#include "section/sectioncommands.h"
+
+struct T_SECTION_CHECK_COMMAND : T_SECTION_COMMAND {
+    /// N, My, Mz, Vy, Vz, T in units of the file: a value for each set of forces, or one for all.
+    std::array<std::vector<double>, 6> forces;
+    std::vector<std::string> codes; // of kSectionCheckCodeNames; empty: all
+    double cotTheta = 1.0;
+    bool trace = false;
+};
+inline constexpr std::array<const char*, 6> kSectionForceNames{"axial", "my", "mz",
+                                                               "vy",    "vz", "torsion"};
+
+/// Checks and prints. BadInput with the first section that can't be checked, nothing written.
+EXIT_CODE RunSectionCheck(const T_SECTION_CHECK_COMMAND& command);

@@ -1,0 +1,103 @@
+#include "qm_rps/section/sectionchecktable.h"
+
+#include "qm_base/say.h"
+#include "qm_base/textformat.h"
+#include "qm_rps/dialog/unithead.h"
+#include "qm_rps/generate/codehingerows.h"
+#include "qm_rps/section/sectionexport.h"
+
+#include <algorithm>
+
+namespace {
+
+constexpr std::array<const char*, 5> kChecked{"IDS_QM_SECK_AXIAL", "IDS_QM_SECK_BENDING",
+                                              "IDS_QM_SECK_SHEAR_Y", "IDS_QM_SECK_SHEAR_Z",
+                                              "IDS_QM_SECK_TORSION"};
+
+std::string WhatText(const T_SECTION_WAY& way)
+{
+    return Say(kChecked[static_cast<std::size_t>(way.what)]);
+}
+
+std::string ByText(const T_SECTION_WAY& way)
+{
+    return way.by.empty() ? Say("IDS_QM_SECK_EXACT") : way.by;
+}
+
+std::string VerdictText(const T_SECTION_WAY& way)
+{
+    if (!way.ratio) return Say("IDS_QM_SECK_NOT_CHECKED", way.reason);
+    return Say(*way.ratio > 1.0 ? "IDS_QM_SECK_EXCEEDED" : "IDS_QM_SECK_KEPT");
+}
+
+} // namespace
+
+T_TEXT_TABLE SectionCheckTable(const T_SECTION_CHECK& check, const T_UNITS& units)
+{
+    T_TEXT_TABLE t;
+    const auto head = [&](const char* name, T_DIM dim) {
+        t.columns.push_back({HeadWithUnit(name, dim, units), true});
+    };
+    head("N", kDimForce), head("My", kDimMoment), head("Mz", kDimMoment);
+    head("Vy", kDimForce), head("Vz", kDimForce), head("T", kDimMoment);
+    t.columns.push_back({Say("IDS_QM_SECK_HEAD_WHAT"), false});
+    t.columns.push_back({Say("IDS_QM_SECK_HEAD_BY"), false});
+    t.columns.push_back({Say("IDS_QM_SECK_HEAD_RATIO"), true});
+    t.columns.push_back({Say("IDS_QM_SECK_HEAD_VERDICT"), false});
+    for (const T_SECTION_CHECKS& set : check.sets)
+        for (const T_SECTION_WAY& way : set.ways) {
+            const T_SECTION_FORCES& f = set.forces;
+            std::vector<std::string>& row = t.rows.emplace_back();
+            const auto cell = [&](double si, T_DIM dim) {
+                row.push_back(FormatText("%.6g", FromSi(si, units, dim) + 0.0));
+            };
+            cell(f.N, kDimForce), cell(f.My, kDimMoment), cell(f.Mz, kDimMoment);
+            cell(f.Vy, kDimForce), cell(f.Vz, kDimForce), cell(f.T, kDimMoment);
+            row.push_back(WhatText(way));
+            row.push_back(ByText(way));
+            row.push_back(way.ratio ? FormatText("%.4g", *way.ratio) : std::string("-"));
+            row.push_back(VerdictText(way));
+        }
+    return t;
+}
+
+std::vector<std::string> SectionCheckHead(const T_SECTION_CHECK& check, const T_UNITS& units)
+{
+    T_SECTION_ANSWER like; // its head is that of every answer on this section
+    like.section = check.section, like.material = check.material;
+    like.options = check.options, like.ofConcrete = check.ofConcrete;
+    like.trace = check.trace, like.warnings = check.warnings;
+    std::vector<std::string> lines = SectionHead(like, units);
+    for (const T_SECTION_CHECKS& set : check.sets)
+        for (const T_SECTION_WAY& way : set.ways)
+            for (const T_CODE_WARNING& warning : way.warnings) {
+                const std::string text = "! " + WarningText(warning);
+                if (std::ranges::find(lines, text) == lines.end()) lines.push_back(text);
+            }
+    return lines;
+}
+
+std::vector<std::string> SectionCheckTrace(const T_SECTION_CHECK& check, const T_UNITS& units)
+{
+    std::vector<std::string> lines;
+    std::size_t number = 0;
+    for (const T_SECTION_CHECKS& set : check.sets) {
+        ++number;
+        for (const T_SECTION_WAY& way : set.ways) {
+            lines.push_back(
+                Say("IDS_QM_SECK_TRACE", std::to_string(number), WhatText(way), ByText(way)));
+            if (!way.ratio) lines.push_back("  " + VerdictText(way));
+            for (const T_CODE_TRACE& line : way.trace)
+                lines.push_back("  " + TraceLine(line, units));
+        }
+    }
+    return lines;
+}
+
+T_TEXT_TABLE SectionCheckExport(const std::vector<T_SECTION_CHECK>& checks, const T_UNITS& units)
+{
+    T_TEXT_TABLE all;
+    for (const T_SECTION_CHECK& check : checks)
+        AppendOfSection(check.section, check.material, SectionCheckTable(check, units), all);
+    return all;
+}
