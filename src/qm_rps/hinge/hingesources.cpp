@@ -2,7 +2,7 @@
 
 namespace {
 
-constexpr std::size_t kSurfaceRows = 24; // axial forces of a surface
+constexpr std::size_t kSurfaceRows = 48; // axial forces of a surface
 
 template <class R>
 const R* Find(const T_TABLE<R>& table, int key)
