@@ -2,6 +2,7 @@
 #include "qm_base/say.h"
 #include "qm_rps/judge/judgedchecks.h"
 
+#include <algorithm>
 #include <cmath>
 
 namespace {
@@ -54,7 +55,9 @@ void CheckMasonry(const T_CHECKING& c)
             c.end.By() == HINGE_CODE::En1998 ? "EN 1998-3 Annex C" : "Circolare 2019 C8.7.1.3.1.1";
     }
     if (!shear) return;
-    shear->trace = side->trace;
+    // Its lines stand with the rotation.
+    for (const T_CODE_TRACE& line : side->trace)
+        shear->leastSure = std::max(shear->leastSure, line.mark);
     shear->at.fill(T_CHECK{std::fabs(c.with.brittle.V), side->shearStrength});
     shear->clause.fill(c.end.By() == HINGE_CODE::En1998 ? "EN 1998-3 Annex C"
                                                         : "Circolare 2019 C8.7.1.3.1.1");

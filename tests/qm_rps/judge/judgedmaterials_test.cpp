@@ -1,0 +1,126 @@
+// Piers of masonry, walls and round columns of concrete in a state of a push, by hand.
+#include "qm_rps/judge/judgedend.h"
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <numbers>
+
+namespace {
+
+constexpr double kN = 1000.0; // N
+constexpr auto kRotation = JUDGE_MODE::Rotation, kShear = JUDGE_MODE::Shear;
+
+/// The foot of a member of 3 m whose M / V is 3 m.
+T_JUDGED_END Foot(HINGE_CODE code, MEMBER_KIND kind)
+{
+    T_JUDGED_END end;
+    end.basis = JUDGE_BASIS::Code;
+    end.member.code = code;
+    end.member.kind = kind;
+    end.member.clear = end.member.length = 3.0;
+    end.member.EI = 4e8, end.member.GA = 3e8;
+    end.member.material.knowledge = MATL_KNOWLEDGE::KL2;
+    return end;
+}
+
+T_JUDGED_END Pier(HINGE_CODE code)
+{
+    T_JUDGED_END end = Foot(code, MEMBER_KIND::Pier);
+    end.member.section.shape = SECT_SHAPE::Rectangle;
+    end.member.section.size = {2.0, 0.4, 0.0, 0.0};
+    T_MATL_D& m = end.member.material;
+    m.type = MATL_CLASS::Masonry;
+    m.mean = T_MATL_MEAN{};
+    m.mean->fc = 3.2e6;
+    m.masonry = T_MATL_MASONRY{};
+    m.masonry->tau0 = 76e3, m.masonry->fv0 = 150e3, m.masonry->fb = 8e6;
+    m.masonry->bond = BOND_KIND::Regular;
+    m.masonry->interlocking = 1.0;
+    return end;
+}
+
+T_JUDGED_END OfConcrete(HINGE_CODE code, MEMBER_KIND kind)
+{
+    T_JUDGED_END end = Foot(code, kind);
+    T_MATL_D& m = end.member.material;
+    m.type = MATL_CLASS::Concrete;
+    m.fck = 20e6, m.fyk = 400e6, m.Es = 200e9, m.E = 15e9;
+    m.mean = T_MATL_MEAN{28e6, 450e6, 0.0};
+    end.member.section.detailing = T_SECT_DETAIL{0.03, 0.008, 0.15};
+    return end;
+}
+
+T_END_CHECKS Checked(const T_JUDGED_END& end, double N, double V, double chord)
+{
+    T_END_STATE s;
+    s.N = N;
+    s.V = V;
+    s.M = 3.0 * V;
+    s.chord = chord;
+    T_STATE_CONTEXT with;
+    with.brittle = s;
+    with.gravity = T_END_STATE{};
+    return CheckEnd(end, s, with);
+}
+
+} // namespace
+
+// N = 300. Annex C: 83.8 in flexure, V = 0.065 fm/CF 0.4 3 (1 - 3 V/300) = 208/3.08 in sliding,
+// which comes first: drift 0.004. NTC: Mu/h0 = 83.5 comes first: 3/4 of 0.01; sliding 520/0.7 0.4 3
+// (1 - 3 V/300) = 891.4286/9.914286.
+TEST(JudgedMaterials, PiersByTheDriftOfTheModeThatComesFirst)
+{
+    const struct {
+        HINGE_CODE code;
+        double drift, shear;
+    } kCases[] = {{HINGE_CODE::En1998, 0.004, 208.0 / 3.08},
+                  {HINGE_CODE::Circolare2019, 0.0075, 891.4285714 / 9.914285714}};
+    for (const auto& c : kCases) {
+        const T_JUDGED_END end = Pier(c.code);
+        const T_END_CHECKS checks = Checked(end, 300.0 * kN, 80.0 * kN, -0.003);
+        ASSERT_TRUE(checks.At(kRotation, 1));
+        EXPECT_NEAR(0.003 / c.drift, *checks.At(kRotation, 1)->Ratio(), 1e-9);
+        ASSERT_TRUE(checks.At(kShear, 1));
+        EXPECT_NEAR(80.0 / c.shear, *checks.At(kShear, 1)->Ratio(), 1e-6);
+        T_JUDGED_END hinged = end; // its drift judges the shear
+        hinged.shearHinge = true;
+        EXPECT_FALSE(Checked(hinged, 300.0 * kN, 80.0 * kN, -0.003).Of(kShear));
+    }
+    EXPECT_NE("", Checked(Pier(HINGE_CODE::Asce17), 300.0 * kN, 80.0 * kN, 0.0).Of(kRotation)->why);
+}
+
+// 2.0 x 0.3: (2 sqrt(2900.75 psi) + 400 MPa 100.53/(300 150)) 0.6 m2, kappa 0.9; 1.69 V.
+TEST(JudgedMaterials, ShearOfWallsIsThatOfWalls)
+{
+    T_JUDGED_END end = OfConcrete(HINGE_CODE::Asce17, MEMBER_KIND::Wall);
+    end.member.section.shape = SECT_SHAPE::Rectangle;
+    end.member.section.size = {2.0, 0.3, 0.0, 0.0};
+    for (const double y : {-0.1, 0.1})
+        for (const double z : {-0.9, -0.3, 0.3, 0.9})
+            end.member.section.bars.push_back({y, z, 254.469e-6});
+    const T_END_CHECKS checks = Checked(end, 1000.0 * kN, 100.0 * kN, 0.0);
+    ASSERT_TRUE(checks.At(kShear, 1));
+    const double psi = 6894.757293168;
+    const double steel = 400e6 * 2.0 * std::numbers::pi / 4.0 * 0.008 * 0.008 / (0.3 * 0.15);
+    const double strength = 0.9 * 0.6 * (2.0 * std::sqrt(20e6 / psi) * psi + steel);
+    EXPECT_NEAR(169.0 * kN / strength, *checks.At(kShear, 1)->Ratio(), 1e-6);
+}
+
+// (A.4) with curvatures of the circle, not (A.1), which is of rectangles; its shear has no number.
+TEST(JudgedMaterials, RoundColumnsAreNotTakenForRectangles)
+{
+    T_JUDGED_END end = OfConcrete(HINGE_CODE::En1998, MEMBER_KIND::Column);
+    end.member.section.shape = SECT_SHAPE::Circle;
+    end.member.section.size = {0.5, 0.0, 0.0, 0.0};
+    for (int i = 0; i < 10; ++i) {
+        const double turn = i * std::numbers::pi / 5.0;
+        end.member.section.bars.push_back({0.2 * std::cos(turn), 0.2 * std::sin(turn), 254e-6});
+    }
+    const T_END_CHECKS checks = Checked(end, 1000.0 * kN, 100.0 * kN, 0.01);
+    ASSERT_TRUE(checks.At(kRotation, 2));
+    for (const T_CODE_TRACE& line : checks.Of(kRotation)->trace)
+        EXPECT_NE("EN 1998-3 (A.1)", line.clause);
+    EXPECT_FALSE(checks.At(kShear, 2));
+    EXPECT_NE("", checks.Of(kShear)->why);
+}
