@@ -282,6 +282,15 @@ void CaseFields(V& v, T_FIELD_REF<V, T_HINGE_LENGTH> r)
 }
 
 template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_STEEL_CONNECTION> r)
+{
+    v.Need("kind", r.kind);
+    v.Opt("column_flange", r.columnFlange, 0.0); // SI, as all that follows from a generator
+    v.Opt("continuity_plate", r.continuityPlate, 0.0);
+    v.Opt("panel_ratio", r.panelRatio, 0.0);
+}
+
+template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_GENERATED> r)
 {
     v.Need("code", r.code);
@@ -292,6 +301,7 @@ void CaseFields(V& v, T_FIELD_REF<V, T_GENERATED> r)
     v.Opt("pushed", r.pushed, {});
     v.Opt("axial_range", r.axialRange, {});
     v.Opt("tie", r.tie, 0.0);
+    v.PartIf("connection", r.connection);
 }
 
 /// Dimensions of a component's curve in a definition.

@@ -192,6 +192,15 @@ struct T_HINGE_LENGTH {
     bool operator==(const T_HINGE_LENGTH&) const = default;
 };
 
+/// Fully restrained connection that the hinges of a steel beam were made for. SI.
+struct T_STEEL_CONNECTION {
+    std::string kind;             // "RBS"
+    double columnFlange = 0.0;    // thickness; 0: of the frame's columns
+    double continuityPlate = 0.0; // thickness; 0: none
+    double panelRatio = 0.0;      // Vpz / Vye of the panel zone; 0: of the frame
+    bool operator==(const T_STEEL_CONNECTION&) const = default;
+};
+
 /// Where a generated hinge type came from.
 struct T_GENERATED {
     std::string code;       // "ASCE41-17"
@@ -206,6 +215,7 @@ struct T_GENERATED {
     std::vector<double> pushed{};
     std::vector<double> axialRange{}; // curves by axial force: from, to; SI; empty: none
     double tie = 0.0;                 // strength of what ties a spandrel, SI
+    std::optional<T_STEEL_CONNECTION> connection{}; // of a steel beam; absent: the beam's own rows
     bool operator==(const T_GENERATED&) const = default;
 };
 
