@@ -303,7 +303,10 @@ std::string CHingeGenerator::StaleText(const T_PHGE_D& hinge) const
     if (!CalcHinge(hinge.hingeType, hinge.element, today, refusal, hinge.axialCase)) {
         // What else is wrong with the element is told as such.
         const bool axial = refusal.key == kNoAxial || refusal.key == kAxialBeyond;
-        return axial ? refusal.why : text;
+        if (axial) text = refusal.why;
+        while (text.ends_with('.'))
+            text.pop_back(); // it stands within a sentence
+        return text;
     }
     Compare("", hinge.yield, today.yield, text);
     Compare("", hinge.crack, today.crack, text);

@@ -215,6 +215,15 @@ TEST(HingeGenerator, TellsStrengthsThatTheSectionNoLongerGives)
     EXPECT_EQ("IDS_QM_HINGE_STALE", found[0].messageKey);
     EXPECT_EQ("My(+) 300, now 280; My(-) 300, now 280",
               CPushOverHingeListDlg(doc).Rows(false)[0].stale);
+    // Where the axial force of its strengths is gone, the reason stands within the sentence.
+    T_PHGE_D hinge;
+    ASSERT_EQ(1, doc.Attr().GetPhge(1, hinge));
+    hinge.axialCase = 7;
+    ASSERT_EQ(1, doc.Edit().Begin("case") && doc.Edit().Put(1, hinge) && doc.Edit().Commit());
+    const auto lost = CHingeGenerator(doc).ElementFindings(1);
+    ASSERT_FALSE(lost.empty());
+    EXPECT_EQ(std::string::npos, lost.back().text.find(".."));
+    EXPECT_NE(std::string::npos, lost.back().text.find("not known")) << lost.back().text;
     // A hinge that is assigned, but has no strengths yet, is not stale.
     ASSERT_EQ(1,
               doc.Edit().Begin("bare") && doc.Edit().Put(1, T_PHGE_D{1, 1}) && doc.Edit().Commit());
