@@ -106,6 +106,31 @@ T_ROUND_CORE RoundCore(const T_SECT_D& s)
     return core;
 }
 
+/// EN 1998-3 (A.2) and A.3.2.2(8), with the smaller ratio of the two directions.
+std::optional<T_CONFINED> Annex3(const T_SECT_D& s, const T_SECTION_STRENGTHS& f, CCodeSheet& sheet)
+{
+    constexpr const char* kClause = "EN 1998-3 A.3.2.2";
+    const T_SECT_DETAIL& d = *s.detailing;
+    double alpha = 0.0, ratio = 0.0;
+    if (s.shape == SECT_SHAPE::Circle) {
+        const T_ROUND_CORE core = RoundCore(s);
+        const double arch = std::max(0.0, 1.0 - core.spacing / (2.0 * core.diameter));
+        alpha = sheet.Put("alpha", arch * arch, "EN 1998-1 5.4.3.2.2(8)", "(1 - s/2 D0)^2", R);
+        const double leg = std::numbers::pi / 4.0 * d.stirrupDiameter * d.stirrupDiameter;
+        ratio = 2.0 * leg / (s.size[0] * core.spacing);
+    } else {
+        const T_RECT_CORE core = RectCore(s, false);
+        const auto grip =
+            HoopEffectiveness({core.bx, core.by, core.spacing, core.gaps, true}, sheet);
+        if (!grip) return {};
+        alpha = *grip;
+        ratio = std::min(core.areaX / (s.size[0] * core.spacing),
+                         core.areaY / (s.size[1] * core.spacing));
+    }
+    sheet.Put("rho_sx", ratio, kClause, "Asx/(bw sh), the smaller of both directions", K);
+    return Annex3Confined(alpha * ratio * f.fyw, f.fcClass, sheet);
+}
+
 std::optional<T_CONFINED> Confined(const T_SECT_D& s, const T_SECTION_STRENGTHS& f,
                                    const T_SECTION_OPTIONS& o, CCodeSheet& sheet)
 {
@@ -114,6 +139,7 @@ std::optional<T_CONFINED> Confined(const T_SECT_D& s, const T_SECTION_STRENGTHS&
         sheet.Refuse(CODE_REASON::Missing, "hooks: 135", s.name);
         return {};
     }
+    if (o.core == SECTION_CORE::En1998) return Annex3(s, f, sheet);
     const T_CONFINED_MATERIAL m{f.fcClass, kPlainPeak, f.fyw, o.hoopStrain};
     if (mander && o.hoopStrain == 0.0) sheet.Warn("IDS_QM_SECC_WARN_HOOP_STRAIN", {});
     if (round)

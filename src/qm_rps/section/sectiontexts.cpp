@@ -92,8 +92,9 @@ std::string SectionOptionsText(const T_SECTION_ANSWER& answer)
     constexpr std::array<const char*, 6> kValues{
         "IDS_QM_SECC_CHARACTERISTIC", "IDS_QM_SECC_MEAN",   "IDS_QM_SECC_EXPECTED",
         "IDS_QM_SECC_LOWER",          "IDS_QM_SECC_DESIGN", "IDS_QM_SECC_ASSESSED"};
-    constexpr std::array<const char*, 3> kCores{"", "IDS_QM_SECC_CORE_MANDER",
-                                                "IDS_QM_SECC_CORE_EUROCODE"};
+    constexpr std::array<const char*, 5> kCores{"", "IDS_QM_SECC_CORE_MANDER",
+                                                "IDS_QM_SECC_CORE_EUROCODE", "IDS_QM_SECC_CORE_NTC",
+                                                "IDS_QM_SECC_CORE_EN1998"};
     const T_SECTION_OPTIONS& o = answer.options;
     std::string text = Say(kValues[static_cast<std::size_t>(o.values)]);
     if (answer.ofConcrete)

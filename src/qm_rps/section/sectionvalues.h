@@ -20,8 +20,9 @@ enum class SECTION_LAW { Eurocode, Aci };
 inline constexpr std::array<const char*, 2> kSectionLawNames{"eurocode", "aci"};
 
 /// The core within the stirrups; the cover then spalls.
-enum class SECTION_CORE { Plain, Mander, Eurocode };
-inline constexpr std::array<const char*, 3> kSectionCoreNames{"no", "mander", "eurocode"};
+enum class SECTION_CORE { Plain, Mander, Eurocode, Ntc, En1998 };
+inline constexpr std::array<const char*, 5> kSectionCoreNames{"no", "mander", "eurocode", "ntc",
+                                                              "en1998"};
 
 struct T_SECTION_OPTIONS {
     SECTION_VALUES values = SECTION_VALUES::Characteristic;

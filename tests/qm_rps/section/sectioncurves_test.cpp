@@ -175,6 +175,15 @@ TEST(SectionCurves, TheEurocodeCoreIsThatOfTheStirrupsAndTheCoverSpalls)
     EXPECT_NEAR(29.4618e6 / 1.5,
                 SectionModelOf(Column(), Concrete(), options, true, design)->laws.at(2).strength,
                 1e2);
+    // EN 1998-3: alpha 0.416315, rho of the longer side 3 legs/(0.5 0.1), fyw/fc = 18.
+    options.values = SECTION_VALUES::Characteristic;
+    options.core = SECTION_CORE::En1998;
+    CCodeSheet annex;
+    const auto confined = SectionModelOf(Column(), Concrete(), options, true, annex);
+    ASSERT_TRUE(confined);
+    EXPECT_NEAR(28553703.98, confined->laws.at(2).strength, 1.0);
+    EXPECT_NEAR(0.00342148159, confined->laws.at(2).peakStrain, 1e-9);
+    EXPECT_NEAR(0.01389380341, confined->laws.at(2).limitStrain, 1e-9);
 }
 
 // Unconfined and confined share fcc / fc = 1 at no pressure only: the ultimate strain grows with
