@@ -201,7 +201,7 @@ void AddNumbers(CFormView& form, DLG& d)
 {
     form.Columns();
     CFormField& picture = form.Picture([&d] { return BackbonePlot(d); });
-    picture.widget->setMinimumSize(340, 220);
+    picture.widget->setMinimumSize(340, 240);
     if (auto* view = dynamic_cast<CPlotWidget*>(picture.widget)) view->SetSizeHint({480, 330});
     form.NextColumn(1);
     AddTable(form, GridOf([&d] { return d.Trace(); }), "trace", {400, 200}, 1000);

@@ -204,7 +204,9 @@ CFormField& MarkedGrid(CFormView& form, std::shared_ptr<CNumberGrid> grid,
 
 void LeaveWidth(CFormField& picture)
 {
-    if (auto* view = dynamic_cast<CPlotWidget*>(picture.widget)) view->SetSizeHint({420, 480});
+    constexpr int kLeast = 380; // its legend is readable
+    picture.widget->setMinimumWidth(kLeast);
+    if (auto* view = dynamic_cast<CPlotWidget*>(picture.widget)) view->SetSizeHint({kLeast, 480});
 }
 
 CFormField& AddBackbonePicture(CFormView& form, std::function<T_PLOT(bool box)> plot)

@@ -213,3 +213,26 @@ TEST_F(DialogWindow, AFormLargerThanTheScreenScrolls)
     EXPECT_LE(window.height(), window.screen()->availableSize().height());
     EXPECT_GT(window.Form().height(), window.height());
 }
+
+TEST_F(DialogWindow, PicturesGiveRoomBeforeAFormWithAWrappedTextScrolls)
+{
+    CViewFactory factory;
+    factory.Register<CSpanDlg>(PlainLabel("Pictures"), [](CFormView& form, CSpanDlg&) {
+        form.Columns();
+        std::string words;
+        for (int i = 0; i < 40; ++i)
+            words += "some words ";
+        form.Note(PlainLabel(words)).name = "words";
+        form.NextColumn(1);
+        form.Picture([] { return T_PLOT(); });
+        form.EndColumns();
+        form.Picture([] { return T_PLOT(); });
+    });
+    CDialogWindow window(factory, *factory.Find(m_model), m_model, nullptr);
+    window.show();
+    window.resize(1000, 620); // pictures need 240 each, and would like 480
+    QApplication::processEvents();
+    EXPECT_LT(window.Form().height(), window.height());
+    QWidget* const words = window.Form().Find("words")->widget;
+    EXPECT_GE(words->height(), words->heightForWidth(words->width()));
+}
