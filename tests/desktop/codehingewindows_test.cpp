@@ -248,39 +248,43 @@ TEST_F(CodeHingeWindows, APushGivesTheShearAndStaleTypesKeepIt)
 TEST_F(CodeHingeWindows, AxialForcesAreThoseOfTheUnitsAndOfTheStaleTypes)
 {
     CDBDoc& doc = m_main->Doc();
+    const T_UNITS stored = Model().styp.units; // kN, m
+    const auto change = [&doc](const T_UNITS& units, double spacing) {
+        T_STYP_D styp = doc.Data().Model().styp;
+        styp.units = units;
+        CEditScope edit(doc, "Other units, closer stirrups");
+        ASSERT_TRUE(edit.PutStyp(styp));
+        T_SECT_D column;
+        ASSERT_TRUE(doc.Attr().GetSect(1, column));
+        column.detailing->stirrupSpacing = spacing;
+        ASSERT_TRUE(edit.Put(1, column) && edit.Commit());
+    };
+    change({FORCE_UNIT::N, LENGTH_UNIT::mm}, 150.0);
     Show([](CDialogWindow& w) {
         EXPECT_TRUE(Field(w, "axialFrom")->isHidden()); // of chord rotations there are none
         EXPECT_TRUE(Field(w, "tie")->isHidden());       // no masonry
         ChooseIndex(Field(w, "code"), static_cast<int>(HINGE_CODE::Asce17));
         Enter(w, "elements", "1, 2");
-        Enter(w, "axialFrom", "300");
-        Enter(w, "axialTo", "100");
+        Enter(w, "axialFrom", "300000");
+        Enter(w, "axialTo", "100000");
         Push(w, "IDS_QM_UI_GEN_PREVIEW");
-        EXPECT_TRUE(Says(w, "300..100: expected two forces"));
+        EXPECT_TRUE(Says(w, "300000..100000: expected two forces"));
         Enter(w, "axialTo", "");
         Push(w, "IDS_QM_UI_GEN_PREVIEW");
-        EXPECT_TRUE(Says(w, "300..?: expected two forces"));
-        Enter(w, "axialFrom", "100");
-        Enter(w, "axialTo", "300");
+        EXPECT_TRUE(Says(w, "300000..?: expected two forces"));
+        Enter(w, "axialFrom", "100000");
+        Enter(w, "axialTo", "300000");
         Push(w, "IDS_QM_UI_GEN_APPLY");
         Cancel(w);
     });
     ASSERT_FALSE(Model().hingeTypes.empty());
     for (const auto& [key, type] : Model().hingeTypes)
         EXPECT_EQ((std::vector<double>{1e5, 3e5}), type.generated->axialRange);
-    T_SECT_D column;
-    ASSERT_TRUE(doc.Attr().GetSect(1, column));
-    column.detailing->stirrupSpacing = 0.1;
-    T_STYP_D styp = Model().styp;
-    styp.units = {FORCE_UNIT::N, LENGTH_UNIT::mm};
-    {
-        CEditScope edit(doc, "Closer stirrups, other units");
-        ASSERT_TRUE(edit.Put(1, column) && edit.PutStyp(styp) && edit.Commit());
-    }
+    change(stored, 0.1);
     Show([](CDialogWindow& w) {
         Push(w, "IDS_QM_UI_GEN_STALE_BTN");
-        EXPECT_EQ("100000", TextAt(w, "axialFrom"));
-        EXPECT_EQ("300000", TextAt(w, "axialTo"));
+        EXPECT_EQ("100", TextAt(w, "axialFrom"));
+        EXPECT_EQ("300", TextAt(w, "axialTo"));
         EXPECT_EQ(static_cast<int>(HINGE_CODE::Asce17),
                   qobject_cast<QComboBox*>(Field(w, "code"))->currentIndex());
         Push(w, "IDS_QM_UI_GEN_APPLY");

@@ -106,7 +106,7 @@ int CCodeHingeOptions::Read(std::vector<int> elements, T_CODE_REQUEST& out,
     if (HasAxialCurves() && (from || to)) {
         if (!from || !to || !(*from < *to)) {
             const auto text = [](const std::optional<double>& force) {
-                return force ? ShortestText(*force) : std::string("?");
+                return force ? FormatText("%.10g", *force) : std::string("?");
             };
             reason = Say("IDS_QM_GEN_RANGE", text(from) + ".." + text(to));
             return 0;
