@@ -121,7 +121,7 @@ int CCodeHingeDlg::OnPreview()
     if (!m_options.Read({m_elements.begin(), m_elements.end()}, request, refusal.text) ||
         !m_options.Preview(request, hinges, refusal)) {
         Forget();
-        m_status = refusal.text;
+        m_status = Say("IDS_QM_UI_GEN_NO_HINGES", refusal.text);
         return 0;
     }
     Take(std::move(hinges));

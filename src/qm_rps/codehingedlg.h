@@ -40,7 +40,7 @@ public:
 
     // ---- what they would get ----
     /// Works the hinges out, with the pushes that they need; the document stays as it is. 0:
-    /// StatusText says why not.
+    /// StatusText says why not, and where what is missing is entered.
     int OnPreview();
     bool HasPreview() const { return !m_firsts.empty(); }
     /// A row for each type: section, member, elements.
