@@ -53,6 +53,8 @@ private:
     {
         for (std::size_t v = 0; v < count.count.size(); ++v)
             w.Member(kVerdictNames[v], count.count[v]);
+        for (std::size_t v = 0; v < count.joints.size(); ++v)
+            w.Member(("joints " + std::string(kVerdictNames[v])).c_str(), count.joints[v]);
     }
 
     void WriteCheck(CJsonText& w, const T_JUDGED_END& end, const T_MODE_CHECK& mode,

@@ -37,6 +37,12 @@ void Conclude(std::size_t level, T_JUDGED_ROW& row)
                             : VERDICT::NotChecked;
 }
 
+void Count(const T_JUDGED_END& end, VERDICT verdict, T_VERDICT_COUNT& to)
+{
+    ++to.count[static_cast<std::size_t>(verdict)];
+    if (end.joint) ++to.joints[static_cast<std::size_t>(verdict)];
+}
+
 /// Not fulfilled without capacity, then falling ratios, then those without one; equal ones (but for
 /// rounding) by their place.
 std::vector<T_JUDGED_ROW> Sorted(std::vector<T_JUDGED_ROW> rows)
@@ -83,11 +89,11 @@ void JudgeState(const std::vector<T_JUDGED_END>& ends, const T_JUDGED_PATH& path
             for (T_MODE_CHECK& mode : row.checks.modes)
                 mode.trace = {};
         Conclude(state.level, row);
-        ++state.all.count[static_cast<std::size_t>(row.verdict)];
+        Count(ends[e], row.verdict, state.all);
         auto storey = std::ranges::find(state.storeys, ends[e].storey, &T_VERDICT_COUNT::storey);
         if (storey == state.storeys.end())
             storey = state.storeys.insert(storey, {ends[e].storey, {}});
-        ++storey->count[static_cast<std::size_t>(row.verdict)];
+        Count(ends[e], row.verdict, *storey);
         state.rows.push_back(std::move(row));
     }
     state.rows = Sorted(std::move(state.rows));

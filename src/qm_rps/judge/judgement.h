@@ -21,7 +21,8 @@ struct T_JUDGED_ROW {
 
 struct T_VERDICT_COUNT {
     std::string storey;
-    std::array<std::size_t, kVerdictNames.size()> count{}; // ends by VERDICT
+    std::array<std::size_t, kVerdictNames.size()> count{};  // ends by VERDICT
+    std::array<std::size_t, kVerdictNames.size()> joints{}; // of these
 };
 
 /// One limit state at one displacement.

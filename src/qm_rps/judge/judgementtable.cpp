@@ -139,6 +139,10 @@ std::string VerdictCountText(const T_VERDICT_COUNT& count)
     for (std::size_t v = 0; v < count.count.size(); ++v)
         text += (v == 0 ? "" : ", ") + VerdictText(static_cast<VERDICT>(v)) + " " +
                 std::to_string(count.count[v]);
+    const auto& [holds, fails, unknown] = count.joints;
+    if (holds + fails + unknown > 0)
+        text += "; " + Say("IDS_QM_JUDGE_OF_JOINTS", std::to_string(holds), std::to_string(fails),
+                           std::to_string(unknown));
     return text;
 }
 
