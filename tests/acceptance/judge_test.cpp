@@ -243,6 +243,10 @@ TEST_F(Judge, SteelByHand)
         EXPECT_NEAR(std::max(M / 115.60281347006655, 640.0 / buckled),
                     pressed.at("axial_force").at("ratio"), 1e-6);
     }
+    Write("d.json", OfSteel(2000.0).dump(1)); // beyond Npl
+    const json crushed = Json("judge d.json --code EN1998-3").at(0).at("limit_states");
+    EXPECT_NEAR(2000.0 / buckled, EndOf(crushed.at(0), "I").at("axial_force").at("ratio"), 1e-6);
+    EXPECT_EQ("not fulfilled", EndOf(crushed.at(0), "I").at("verdict"));
     const json asce = Json("judge a.json --code ASCE41-17").at(0).at("limit_states");
     EXPECT_EQ("not checked", EndOf(asce.at(2), "I").at("verdict"));
     Write("c.json", OfSteel(400.0).dump(1));

@@ -105,10 +105,17 @@ bool EnAxial(const T_CHECKING& c, const T_STEEL_BASIS& in, bool withMoments, CCo
         check.at.fill(T_CHECK{pressed, *buckled});
         return true;
     }
-    const double alone = sheet.Put("N/Nb", pressed / *buckled, "EN 1993-1-1 6.3.1", "", K);
+    const double alone =
+        s.N > 0.0 ? sheet.Put("N/Nb", s.N / *buckled, "EN 1993-1-1 6.3.1", "", K)
+                  : sheet.Put("N/Npl", -s.N / in.strength.Npl, "EN 1993-1-1 6.2.3", "", K);
+    check.dim = kDimNone;
     const auto both =
         EnAxialBending(in.shape, in.strength, ForcesOf(in.end, s.N, s.M, s.across), sheet);
-    if (!both) return FillWhy(check, sheet);
+    if (!both && !(alone > 1.0)) return FillWhy(check, sheet);
+    if (!both) { // nothing is left for moments
+        check.at.fill(T_CHECK{alone, 1.0});
+        return true;
+    }
     // 6.2.9.1(2) bends about one axis, (6) about both.
     const T_STEEL_FORCES f = ForcesOf(in.end, s.N, s.M, s.across);
     const double y = std::fabs(f.My) / both->MNy, z = std::fabs(f.Mz) / both->MNz;
@@ -117,7 +124,6 @@ bool EnAxial(const T_CHECKING& c, const T_STEEL_BASIS& in, bool withMoments, CCo
         sheet.Put("bending", std::min(y, z) <= kNothing ? std::max(y, z) : both->ratio,
                   "EN 1993-1-1 6.2.9.1", "M/MN about one axis, else the sum", K);
     if (bent >= alone) check.clause.fill("EN 1993-1-1 6.2.9.1");
-    check.dim = kDimNone;
     check.at.fill(T_CHECK{std::max(bent, alone), 1.0});
     return true;
 }
