@@ -1,5 +1,22 @@
 #include "qm_rps/codes/en1998backbone.h"
 
+namespace {
+
+/// The second expression of theta_um: information, nothing is made of it.
+void PutSecondForm(const T_EN_MEMBER& m, double thetaY, double thetaUm, CCodeSheet& sheet)
+{
+    if (m.basis != EN_BASIS::En1998) return;
+    CCodeSheet own;
+    const std::optional<double> plastic = EnThetaPlastic(m, own);
+    if (!plastic) return;
+    const double second = sheet.Put("theta_y + theta_pl,um", thetaY + *plastic, "EN 1998-3 (A.3)",
+                                    "beside (A.1), not used", CODE_MARK::Recalled);
+    sheet.Put("(A.3) over (A.1), %", 100.0 * (second / thetaUm - 1.0), "", "difference",
+              CODE_MARK::Computed);
+}
+
+} // namespace
+
 std::optional<T_EN_ROTATIONS> EnRotations(const T_EN_HINGE_IN& in, CCodeSheet& sheet)
 {
     const T_EN_MEMBER& m = in.member;
@@ -14,6 +31,7 @@ std::optional<T_EN_ROTATIONS> EnRotations(const T_EN_HINGE_IN& in, CCodeSheet& s
     const std::optional<double> thetaY = EnThetaY(m, form, yield->curvature, cracked, sheet);
     const std::optional<double> thetaUm = EnThetaUm(m, sheet);
     if (!thetaY || !thetaUm) return {};
+    PutSecondForm(m, *thetaY, *thetaUm, sheet);
 
     const std::optional<T_CHORD_LIMITS> limits = EnChordLimits(*thetaY, *thetaUm, m.basis, sheet);
     if (!limits) return {};

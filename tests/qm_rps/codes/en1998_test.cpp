@@ -103,6 +103,12 @@ TEST(En1998, OtherPrintedForms)
     for (const auto& [mu, expected] :
          {std::pair{0.0, 169.732e3}, {3.3644, 141.18e3}, {9., 127.299e3}})
         ExpectRel(expected, EnCyclicShear(m, depth, mu, {}, sheet)->strength, 1e-5, "VR");
+    // (A.3) beside (A.1) of a hinge.
+    CCodeSheet both;
+    const auto rotations = EnRotations({m}, both);
+    ASSERT_TRUE(rotations);
+    ExpectRel(rotations->thetaY + 0.0360194, LineOf(both, "theta_y + theta_pl,um")->value, 1e-5,
+              "(A.3)");
     m.secondary = false;
     ExpectRel(0.0295079, *EnThetaUm(m, sheet), 1e-5, "gamma_el 1.5");
     // A library's docstring gives these inputs; h = z = 0.506, phi_y 0.00638.
