@@ -70,6 +70,23 @@ void ExpectClose(double expected, double actual, const std::string& what)
     EXPECT_NEAR(expected, actual, 2e-6 * std::fabs(expected)) << what;
 }
 
+// Table 10-5: P/(Ag f'cE) = 1/7, 0.342857 EcE Ig with EcE = 57000 sqrt(4061.06 psi); beam 0.3 EcE
+// Ig.
+TEST_F(CodeHinges, TellTheStiffnessOfTheCodeBesideTheModels)
+{
+    const auto line = [](const json& hinge, const char* symbol) -> double {
+        for (const json& l : hinge.at("trace"))
+            if (l.at("symbol") == symbol) return l.at("value");
+        return 0.0;
+    };
+    const json result = Generated("ASCE41-17");
+    const json& column = HingeOf(result, "column", "My", "+-");
+    EXPECT_NEAR(18318.304915793764, line(column, "EI (code)"), 1e-6);
+    EXPECT_NEAR(32000.0, line(column, "EI (model)"), 1e-6);
+    EXPECT_NE(std::string::npos, result.dump().find("EI of the model is 1.747"));
+    EXPECT_NEAR(23479.272658182923, line(HingeOf(result, "beam", "My", "+"), "EI (code)"), 1e-6);
+}
+
 TEST_F(CodeHinges, OfAColumnAreThoseOfAsce41)
 {
     const json result = Generated("ASCE41-17");

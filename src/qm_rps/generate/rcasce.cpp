@@ -1,6 +1,8 @@
 #include "qm_rps/generate/rchinge.h"
 
 #include <algorithm>
+#include <cmath>
+#include <numbers>
 
 namespace {
 
@@ -134,6 +136,34 @@ std::optional<T_CODE_PLASTIC> AsceWallEnd(const T_RC_BASIS& in, T_CODE_SIDE& sid
     return AsceWallFlexure(wall, sheet);
 }
 
+/// Table 10-5 beside the stiffness of the model, which the push takes.
+bool CompareStiffness(const T_RC_BASIS& in, CCodeSheet& sheet)
+{
+    constexpr double kSame = 0.05;
+    constexpr const char* kTable = "ASCE 41 Table 10-5";
+    constexpr T_DIM kDimBending{1, 2};
+    if (in.end.code == HINGE_CODE::Fema356) return true; // its table is not known to us
+    const T_RC_BENDING& s = in.section;
+    const ASCE_MEMBER member = in.end.kind == MEMBER_KIND::Wall     ? ASCE_MEMBER::Wall
+                               : in.end.kind == MEMBER_KIND::Column ? ASCE_MEMBER::Column
+                                                                    : ASCE_MEMBER::Beam;
+    const double ratio = in.axial / (s.area * in.material.fc);
+    const auto share = AsceStiffness(member, ratio, EditionOf(in.end), sheet);
+    if (!share) return false;
+    const double Ec = sheet.Put("EcE", 57000.0 * RootPsi(in.material.fc), kDimStress,
+                                "ACI 318 19.2.2.1", "57000 sqrt(f'cE) psi", CODE_MARK::Recalled);
+    const double gross =
+        s.round ? std::numbers::pi / 64.0 * std::pow(s.h, 4) : s.b * s.h * s.h * s.h / 12.0;
+    const double code =
+        sheet.Put("EI (code)", share->flexure * Ec * gross, kDimBending, kTable, "effective", K);
+    sheet.Put("EI (model)", in.end.EI, kDimBending, "", "E I of the file", K);
+    sheet.Put("GA (code)", share->shear * Ec * s.area, kDimForce, kTable, "effective", K);
+    sheet.Put("GA (model)", in.end.GA, kDimForce, "", "G As of the file; 0: rigid in shear", K);
+    if (std::fabs(in.end.EI / code - 1.0) > kSame)
+        sheet.Warn("IDS_QM_GEN_WARN_STIFFNESS", {CodeNumber(in.end.EI / code), kTable});
+    return sheet.Sound();
+}
+
 std::optional<T_CODE_PLASTIC> PlasticOf(const T_RC_BASIS& in, T_CODE_SIDE& side, CCodeSheet& sheet)
 {
     if (in.end.kind == MEMBER_KIND::Wall) return AsceWallEnd(in, side, sheet);
@@ -149,7 +179,7 @@ std::optional<T_CODE_BACKBONE> AsceBackbone(const T_RC_BASIS& in, T_CODE_SIDE& s
     if (in.end.section.detailing->lapLength > 0.0 && !in.end.section.detailing->poorSplice)
         sheet.Warn("IDS_QM_GEN_WARN_LAP", {});
     const auto plastic = PlasticOf(in, side, sheet);
-    if (!plastic) return {};
+    if (!plastic || !CompareStiffness(in, sheet)) return {};
     const bool shearFirst = side.shear > side.shearStrength;
     if (shearFirst && in.end.kind != MEMBER_KIND::Wall) {
         side.shearBone = ShearBackbone(in, *plastic, side, sheet);
