@@ -25,6 +25,15 @@ void AddGenerate(CLI::App* hinge, EXIT_CODE& code)
     sub->add_option("--push", o->push, Say("IDS_QM_HELP_HINGE_PUSH"));
     sub->add_option("--axial-range", o->axialRange, Say("IDS_QM_HELP_HINGE_AXIAL_RANGE"));
     sub->add_option("--tie", o->tie, Say("IDS_QM_HELP_HINGE_TIE"))->check(CLI::PositiveNumber);
+    sub->add_option("--connection", o->connection.kind, Say("IDS_QM_HELP_HINGE_CONNECTION"))
+        ->check(CLI::IsMember(
+            std::vector<std::string>(kFrConnectionNames.begin(), kFrConnectionNames.end())));
+    const auto measure = [&](const char* name, double& value, const char* help) {
+        sub->add_option(name, value, Say(help))->check(CLI::PositiveNumber);
+    };
+    measure("--column-flange", o->connection.columnFlange, "IDS_QM_HELP_HINGE_COLUMN_FLANGE");
+    measure("--continuity-plate", o->connection.continuityPlate, "IDS_QM_HELP_HINGE_PLATE");
+    measure("--panel-ratio", o->connection.panelRatio, "IDS_QM_HELP_HINGE_PANEL");
     sub->add_flag("--keep-going", o->keepGoing, Say("IDS_QM_HELP_HINGE_KEEP_GOING"));
     sub->add_flag("--trace", o->trace, Say("IDS_QM_HELP_HINGE_TRACE"));
     AddJson(sub, o->json);

@@ -58,6 +58,25 @@ json Case()
     return file;
 }
 
+/// Two storeys of 3.5 m on one side of a beam of 6 m, one on the other.
+json Frame()
+{
+    json file = Case();
+    file.erase("load_cases");
+    file.erase("pushover_control");
+    file["nodes"] = json::parse(R"([{"id": 1, "xyz": [0, 0, 0], "restraint": [1, 1, 1, 1, 1, 1]},
+        {"id": 2, "xyz": [0, 0, 3.5]}, {"id": 3, "xyz": [0, 0, 7]}, {"id": 4, "xyz": [6, 0, 3.5]},
+        {"id": 5, "xyz": [6, 0, 0], "restraint": [1, 1, 1, 1, 1, 1]}])");
+    file["elements"] = json::array();
+    const int nodes[][2] = {{1, 2}, {2, 3}, {5, 4}, {2, 4}};
+    for (int k = 0; k < 4; ++k)
+        file["elements"].push_back({{"id", k + 1},
+                                    {"nodes", {nodes[k][0], nodes[k][1]}},
+                                    {"material", "S"},
+                                    {"section", k == 3 ? "I" : "H"}});
+    return file;
+}
+
 class CodeMembers : public CProgramTest {
 protected:
     json Generated(const std::string& code, const std::string& elements) const
@@ -67,6 +86,66 @@ protected:
                     " -o g.json --overwrite");
     }
 };
+
+// By hand: beam 300 deep, Z 602.098e-6 m3, Fye 303 MPa; Vpz = M 6/5.8/0.3 (3.5 - 0.3)/3.5, Vye =
+// 0.55 303e6 0.2 0.009: 1.917, so 0.8; tcf 15 < 150/7, so 0.8 without plates; L/d 20. RBS: 0.050 -
+// 0.0003 11.811, 0.070 - 0.0003 11.811.
+TEST_F(CodeMembers, SteelBeamsTakeTheirConnections)
+{
+    const auto made = [&](const json& file, const std::string& more) {
+        Write("f.json", file.dump(1));
+        return Json("hinge generate f.json --code ASCE41-17 --elements 4 --connection RBS" + more +
+                    " -o g.json --overwrite");
+    };
+    json r = made(Frame(), "");
+    ExpectHinge(HingeOf(r, "My", "+-"),
+                {{"moment", 182.43580883699996},
+                 {"Vpz/Vye", 1.9174153483604517},
+                 {"a", 0.029732283464566935},
+                 {"b", 0.042532283464566945},
+                 {"c", 0.2}},
+                1e-9, "RBS");
+    EXPECT_FALSE(HingeOf(r, "My", "+-").at("backbone").contains("IO"));
+    r = made(Frame(), " --continuity-plate 0.0107 --panel-ratio 0.75");
+    ExpectHinge(HingeOf(r, "My", "+-"), {{"a", 0.04645669291338583}, {"b", 0.06645669291338584}},
+                1e-9, "all serve");
+    // Another panel: the type is stale, and regenerated with the same connection.
+    (void)made(Frame(), "");
+    json changed = json::parse(Text("g.json"));
+    EXPECT_EQ("RBS", changed["hinge_types"][0]["generated"]["connection"]["kind"]);
+    changed["sections"][0]["size"][2] = 0.022; // 0.7844
+    Write("s.json", changed.dump(1));
+    r = Json("hinge generate s.json --stale -o t.json --overwrite");
+    ExpectHinge(HingeOf(r, "My", "+-"), {{"a", 0.037165354330708666}}, 1e-9, "again");
+
+    json lone = Frame();
+    lone["elements"][2]["section"] = "tube";
+    Write("f.json", lone.dump(1));
+    ExpectRefused("hinge generate f.json --code ASCE41-17 --elements 4 --connection RBS -o x.json",
+                  3, "node 4");
+    ExpectRefused("hinge generate f.json --code EN1998-3 --all --connection RBS -o x.json", 2,
+                  "ASCE41-17");
+    ExpectRefused("hinge generate f.json --code ASCE41-17 --all --panel-ratio 0.7 -o x.json", 2,
+                  "--connection");
+    ExpectRefused("hinge generate f.json --code AISC342-22 --elements 4 -o x.json", 3,
+                  "AISC342-22");
+}
+
+// p = 400/(A Fye) with A = 7530 mm2: a = 5.5 (h/tw)^-0.95 (L/ry)^-0.5 (1 - p)^2.4.
+TEST_F(CodeMembers, DuctileSteelColumnsOfAisc342)
+{
+    const json r = Generated("AISC342-22", "1");
+    const double A = 2 * 0.2 * 0.015 + 0.17 * 0.009, p = 400e3 / (A * 303e6);
+    const double Iz = 2 * 0.015 * std::pow(0.2, 3) / 12 + 0.17 * std::pow(0.009, 3) / 12;
+    const double web = 0.17 / 0.009, length = 3.0 / std::sqrt(Iz / A);
+    ExpectHinge(HingeOf(r, "My", "+-"),
+                {{"a", std::min(0.07, 5.5 * std::pow(web, -0.95) * std::pow(length, -0.5) *
+                                          std::pow(1 - p, 2.4))},
+                 {"b", std::min(0.07, 20 * std::pow(web, -0.9) * std::pow(length, -0.5) *
+                                          std::pow(1 - p, 3.4))},
+                 {"c", 0.4 - 0.4 * p}},
+                1e-6, "AISC 342");
+}
 
 TEST_F(CodeMembers, SteelBends)
 {

@@ -94,6 +94,11 @@ EXIT_CODE ReadRequest(const T_HINGE_GENERATE_OPTIONS& o, CDBDoc& doc, T_CODE_REQ
 {
     const T_UNITS units = doc.Unit().Units();
     request.options.tie = ToSi(o.tie, units, kDimForce);
+    if (!o.connection.kind.empty()) {
+        T_STEEL_CONNECTION& connection = request.options.connection.emplace(o.connection);
+        connection.columnFlange = ToSi(connection.columnFlange, units, kDimLength);
+        connection.continuityPlate = ToSi(connection.continuityPlate, units, kDimLength);
+    }
     if (!o.axialRange.empty()) {
         const auto range = RangeOf(o.axialRange, units);
         if (!range || IsChordCode(request.options.code))
@@ -112,10 +117,22 @@ EXIT_CODE ReadRequest(const T_HINGE_GENERATE_OPTIONS& o, CDBDoc& doc, T_CODE_REQ
     return EXIT_CODE::Done;
 }
 
+EXIT_CODE CheckConnection(const T_HINGE_GENERATE_OPTIONS& o, HINGE_CODE code)
+{
+    T_STEEL_CONNECTION bare;
+    bare.kind = o.connection.kind;
+    if (bare.kind.empty())
+        return o.connection == bare ? EXIT_CODE::Done
+                                    : Complain(EXIT_CODE::Usage, Say("IDS_QM_GEN_NO_CONNECTION"));
+    return code == HINGE_CODE::Asce17
+               ? EXIT_CODE::Done
+               : Complain(EXIT_CODE::Usage, Say("IDS_QM_GEN_CONNECTION_CODE", o.code));
+}
+
 EXIT_CODE CheckOptions(const T_HINGE_GENERATE_OPTIONS& o, T_CODE_REQUEST& request)
 {
     if (o.stale) {
-        if (!o.code.empty() || o.all || !o.elements.empty())
+        if (!o.code.empty() || o.all || !o.elements.empty() || o.connection != T_STEEL_CONNECTION{})
             return Complain(EXIT_CODE::Usage, Say("IDS_QM_GEN_STALE_ALONE"));
         return CheckOutputs(o.file, {{o.out, OUTPUT_KIND::Document}, {o.json, OUTPUT_KIND::Json}},
                             o.overwrite);
@@ -123,10 +140,12 @@ EXIT_CODE CheckOptions(const T_HINGE_GENERATE_OPTIONS& o, T_CODE_REQUEST& reques
     if (o.code.empty()) return Complain(EXIT_CODE::Usage, Say("IDS_QM_GEN_CODE_NEEDED"));
     if (o.all == !o.elements.empty())
         return Complain(EXIT_CODE::Usage, Say("IDS_QM_GEN_ONE_OF", "--all", "--elements"));
-    const auto code = std::ranges::find(kHingeCodeNames, o.code);
-    request.options.code = static_cast<HINGE_CODE>(code - kHingeCodeNames.begin());
+    const auto at = std::ranges::find(kHingeCodeNames, o.code);
+    request.options.code = static_cast<HINGE_CODE>(at - kHingeCodeNames.begin());
     request.options.secondary = o.level == "secondary";
     request.keepGoing = o.keepGoing;
+    if (const EXIT_CODE code = CheckConnection(o, request.options.code); code != EXIT_CODE::Done)
+        return code;
     const std::optional<std::vector<int>> elements = ParseElementList(o.elements);
     if (!elements)
         return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_ELEMENT_LIST", o.elements));

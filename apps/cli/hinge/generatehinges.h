@@ -14,9 +14,10 @@ struct T_HINGE_GENERATE_OPTIONS {
     bool stale = false;            // those of stale types, by their own code and level
     std::string level = "primary"; // or "secondary"
     bool keepGoing = false;
-    std::string push;       // load case whose V counts
-    std::string axialRange; // "from..to"
-    double tie = 0.0;       // of spandrels, file's units
+    std::string push;              // load case whose V counts
+    std::string axialRange;        // "from..to"
+    double tie = 0.0;              // of spandrels, file's units
+    T_STEEL_CONNECTION connection; // of steel beams, file's units; no kind: none
     std::string json, out;
     bool trace = false;
     bool overwrite = false;

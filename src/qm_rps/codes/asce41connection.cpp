@@ -63,6 +63,19 @@ double Factor(const T_FR_CONNECTION& c, CCodeSheet& sheet)
 
 } // namespace
 
+std::optional<double> AscePanelRatio(const T_STEEL_JOINT& j, double depth, CCodeSheet& sheet)
+{
+    sheet.Positive({{"columnDepth", j.columnDepth}, {"columnWeb", j.columnWeb}});
+    sheet.Positive({{"columnFye", j.columnFye}, {"beams", j.beams}, {"depth", depth}});
+    if (!sheet.Within("depth", depth, 0.0, j.storey)) return {};
+    sheet.Put("sum M", j.beams, kDimMoment, kFactors, "Z Fye L/(L - dc) of the beams", R);
+    const double shear = sheet.Put("Vpz", j.beams / depth * (j.storey - depth) / j.storey,
+                                   kDimForce, kFactors, "sum M/d (h - d)/h", R);
+    const double yield = sheet.Put("Vye", 0.55 * j.columnFye * j.columnDepth * j.columnWeb,
+                                   kDimForce, kFactors, "0.55 Fye dc tcw", R);
+    return sheet.Put("Vpz/Vye", shear / yield, kFactors, "", CODE_MARK::Computed);
+}
+
 std::optional<T_CODE_PLASTIC> AsceConnection(const T_FR_CONNECTION& c, CCodeSheet& sheet)
 {
     if (!sheet.Positive({{"depth", c.depth}})) return {};

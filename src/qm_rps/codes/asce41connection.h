@@ -18,6 +18,26 @@ enum class FR_CONNECTION {
     TeeFlexure
 };
 
+/// By FR_CONNECTION; for commands and files.
+inline constexpr std::array<const char*, 11> kFrConnectionNames{
+    "WUF",        "WUF-collapse",   "WUF-B",
+    "WUF-W",      "free-flange",    "RBS",
+    "side-plate", "tee-bolt-shear", "tee-bolt-tension",
+    "tee-stem",   "tee-flexure"};
+
+/// Columns and beams that meet in a panel zone.
+struct T_STEEL_JOINT {
+    double columnFlange = 0.0;                 // thickness; 0: there is no column that is read
+    double columnDepth = 0.0, columnWeb = 0.0; // m
+    double columnFye = 0.0;                    // Pa
+    double storey = 0.0;                       // mean length of the columns above and below, m
+    double beams = 0.0;                        // sum of M L/(L - dc) of the beams, N m
+    bool operator==(const T_STEEL_JOINT&) const = default;
+};
+/// Vpz / Vye of ASCE 41-17 9.4.2.4.3: shear of the panel zone when the beams of depth `depth`
+/// yield, over 0.55 Fye dc tcw.
+std::optional<double> AscePanelRatio(const T_STEEL_JOINT& joint, double depth, CCodeSheet& sheet);
+
 struct T_FR_CONNECTION {
     FR_CONNECTION kind = FR_CONNECTION::WeldedFlange;
     double depth = 0.0; // of the beam, m

@@ -25,8 +25,6 @@ constexpr std::array<T_LADDER, 4> kLadders{{
     {{9.0, 11.0, 0.6, 1.0,  9.0, 11.0}, {4.0, 6.0, 0.2, 0.25, 3.0, 4.0}, R},
 }};
 
-// Panel zone, multiples of the yield angle.
-constexpr T_CODE_PLASTIC kPanel{12.0, 12.0, 1.0, 1.0, 12.0, 12.0};
 
 struct T_BRACE_ROWS {
     BRACE_SHAPE shape;
@@ -92,6 +90,17 @@ T_CODE_PLASTIC SteelBeamLadder(double slenderShare, ASCE_EDITION edition, const 
     return p;
 }
 
+double AsceSlenderShare(const T_STEEL_MEMBER& m, const char* clause, CCodeSheet& sheet)
+{
+    const double root = std::sqrt(m.E / m.Fye);
+    const double flange = sheet.Put("bf/2tf / sqrt(E/Fye)", m.bf / (2.0 * m.tf) / root, clause,
+                                    "compact <= 0.30, slender >= 0.38", S2);
+    const double web = sheet.Put("h/tw / sqrt(E/Fye)", m.h / m.tw / root, clause,
+                                 "compact <= 2.45, slender >= 3.76", S2);
+    return std::max(LinearClamped(flange, 0.30, 0.0, 0.38, 1.0),
+                    LinearClamped(web, 2.45, 0.0, 3.76, 1.0));
+}
+
 std::optional<T_STEEL_PLASTIC> AsceSteelBeam(const T_STEEL_MEMBER& m, ASCE_EDITION edition,
                                              CCodeSheet& sheet)
 {
@@ -100,24 +109,10 @@ std::optional<T_STEEL_PLASTIC> AsceSteelBeam(const T_STEEL_MEMBER& m, ASCE_EDITI
     const bool fema =
         edition == ASCE_EDITION::Fema356Primary || edition == ASCE_EDITION::Fema356Secondary;
     const char* clause = fema ? kFemaBeam : kBeam;
-    const double root = std::sqrt(m.E / m.Fye);
-    const double flange = sheet.Put("bf/2tf / sqrt(E/Fye)", m.bf / (2.0 * m.tf) / root, clause,
-                                    "compact <= 0.30, slender >= 0.38", S2);
-    const double web = sheet.Put("h/tw / sqrt(E/Fye)", m.h / m.tw / root, clause,
-                                 "compact <= 2.45, slender >= 3.76", S2);
-    const double share = std::max(LinearClamped(flange, 0.30, 0.0, 0.38, 1.0),
-                                  LinearClamped(web, 2.45, 0.0, 3.76, 1.0));
+    const double share = AsceSlenderShare(m, clause, sheet);
     const T_CODE_PLASTIC p = SteelBeamLadder(share, edition, clause, sheet);
     if (!sheet.Sound()) return {};
     return T_STEEL_PLASTIC{*yield, InYields(p, *yield, clause, "theta_y", sheet), false};
-}
-
-std::optional<T_STEEL_PLASTIC> AscePanelZone(double yieldAngle, CCodeSheet& sheet)
-{
-    if (!sheet.Positive({{"yieldAngle", yieldAngle}})) return {};
-    PutPlastic(kPanel, kBeam, "panel zone (theta_y)", R, sheet);
-    return T_STEEL_PLASTIC{yieldAngle, InYields(kPanel, yieldAngle, kBeam, "theta_y", sheet),
-                           false};
 }
 
 std::optional<T_STEEL_PLASTIC> AsceBrace(const T_STEEL_BRACE& brace, CCodeSheet& sheet)

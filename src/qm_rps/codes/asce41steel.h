@@ -1,5 +1,5 @@
-// Steel members by ASCE 41: yield rotation, plastic rotations and acceptance of beams, columns,
-// panel zones and braces. All deformations come out absolute: rad, or m for braces.
+// Steel members by ASCE 41: yield rotation, plastic rotations and acceptance of beams, columns
+// and braces. All deformations come out absolute: rad, or m for braces.
 #pragma once
 
 #include "qm_rps/codes/asce41concrete.h"
@@ -15,7 +15,6 @@ struct T_STEEL_MEMBER {
     double ry = 0.0;             // m; Table 9-7.1 and AISC 342
     double axial = 0.0;          // of gravity, compression positive, N
     double axialStrength = 0.0;  // P_CL, lower bound; 41-13 and FEMA 356
-    bool highlyDuctile = false;  // AISC 342
 };
 struct T_STEEL_PLASTIC {
     double yieldRotation = 0.0; // theta_y
@@ -36,15 +35,16 @@ std::optional<T_STEEL_PLASTIC> AsceSteelBeam(const T_STEEL_MEMBER& m, ASCE_EDITI
 /// as 0.
 std::optional<T_STEEL_PLASTIC> AsceSteelColumn(const T_STEEL_MEMBER& m, ASCE_EDITION edition,
                                                CCodeSheet& sheet);
-/// AISC 342-22 C3.6; highly ductile members alone.
+/// AISC 342-22 C3.6; highly ductile members alone (AISC 341 Table D1.1), force-controlled above
+/// P/Pye 0.6.
 std::optional<T_STEEL_PLASTIC> Aisc342Column(const T_STEEL_MEMBER& m, CCodeSheet& sheet);
+
+/// Table 9-6: 0 compact to 1 slender, the worse of flange and web.
+double AsceSlenderShare(const T_STEEL_MEMBER& m, const char* clause, CCodeSheet& sheet);
 
 /// Expected plastic moment with the axial force.
 std::optional<double> AsceSteelMoment(const T_STEEL_MEMBER& m, ASCE_EDITION edition,
                                       CCodeSheet& sheet);
-
-/// Panel zone: shear angles in multiples of the one at yield, which the caller gives.
-std::optional<T_STEEL_PLASTIC> AscePanelZone(double yieldAngle, CCodeSheet& sheet);
 
 enum class BRACE_SHAPE { WideFlange, Tube, Angle }; // 2L in plane as W, out of plane as tube
 struct T_STEEL_BRACE {

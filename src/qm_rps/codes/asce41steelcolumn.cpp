@@ -159,6 +159,23 @@ std::optional<T_STEEL_PLASTIC> Column13(const T_STEEL_MEMBER& m, double yield, A
     return T_STEEL_PLASTIC{yield, InYields(v, yield, kTable13, "theta_y", sheet), false};
 }
 
+/// AISC 341 Table D1.1: the plates of a highly ductile I under a compression of p = P/Pye.
+bool HighlyDuctile(const T_STEEL_MEMBER& m, double p, CCodeSheet& sheet)
+{
+    constexpr const char* kClause = "AISC 341 Table D1.1";
+    constexpr double kPhi = 0.9; // of Ca = P/(phi Pye)
+    const double root = std::sqrt(m.E / m.Fye), Ca = p / kPhi;
+    const double low = 2.57 * (1.0 - 1.04 * Ca), high = std::max(1.57, 0.88 * (2.68 - Ca));
+    const double flange = root * sheet.Put("bf/2tf limit / sqrt(E/Fye)", 0.32, kClause, "", R);
+    const double web =
+        root * sheet.Put("h/tw limit / sqrt(E/Fye)", Ca <= 0.114 ? low : high, kClause,
+                         "Ca <= 0.114: 2.57 (1 - 1.04 Ca); 0.88 (2.68 - Ca) >= 1.57,"
+                         " Ca = P/(0.9 Pye)",
+                         R);
+    return sheet.Within("bf/2tf", m.bf / (2.0 * m.tf), 0.0, flange) &&
+           sheet.Within("h/tw", m.h / m.tw, 0.0, web);
+}
+
 } // namespace
 
 std::optional<T_STEEL_PLASTIC> AsceSteelColumn(const T_STEEL_MEMBER& m, ASCE_EDITION edition,
@@ -174,11 +191,9 @@ std::optional<T_STEEL_PLASTIC> Aisc342Column(const T_STEEL_MEMBER& m, CCodeSheet
 {
     const auto yield = AsceSteelYieldRotation(m, true, ASCE_EDITION::Asce17, sheet);
     if (!yield || !sheet.Positive({{"ry", m.ry}})) return {};
-    if (!m.highlyDuctile) {
-        sheet.Refuse(CODE_REASON::NoRow, "highlyDuctile", kAisc);
-        return {};
-    }
     const double p = std::max(0.0, m.axial) / (m.A * m.Fye);
+    if (!HighlyDuctile(m, p, sheet)) return {};
+    if (p > kForceControlled17) return ForceControlled(*yield, kAisc, sheet);
     const double web = m.h / m.tw, length = m.length / m.ry;
     T_CODE_PLASTIC v;
     v.a = sheet.Put("a",

@@ -129,8 +129,11 @@ std::vector<std::string> HingeRowCells(const T_CODE_ROW_OF_HINGE& row, bool chor
         cells.push_back(deform(bone.Plastic(bone.E.deform)));
         cells.push_back(Digits(bone.D.strength));
     }
-    for (const double level : bone.acceptance.value_or(std::array<double, 3>{}))
+    if (!bone.acceptance) cells.insert(cells.end(), 3, "-"); // not known
+    for (std::size_t i = 0; bone.acceptance && i < bone.acceptance->size(); ++i) {
+        const double level = (*bone.acceptance)[i];
         cells.push_back(deform(chord ? level : bone.Plastic(level)));
+    }
     return cells;
 }
 

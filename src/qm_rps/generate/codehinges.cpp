@@ -2,6 +2,7 @@
 
 #include "qm_base/say.h"
 #include "qm_db/editscope.h"
+#include "qm_rps/generate/steeljoint.h"
 
 #include <algorithm>
 #include <iterator>
@@ -22,6 +23,15 @@ T_HINGE_REFUSAL RefusalOf(int element, const std::string& reason)
     const std::string text =
         element == 0 ? reason : Say("IDS_QM_HINGE_ELEMENT", std::to_string(element), reason);
     return {element, "", reason, text};
+}
+
+/// What a type was made with; none: its code is not known.
+std::optional<T_CODE_OPTIONS> OptionsOf(const T_GENERATED& made)
+{
+    const auto code = std::ranges::find(kHingeCodeNames, made.code);
+    if (code == kHingeCodeNames.end()) return {};
+    return T_CODE_OPTIONS{static_cast<HINGE_CODE>(code - kHingeCodeNames.begin()), made.secondary,
+                          made.tie, made.axialRange, made.connection};
 }
 
 /// Beam elements, and trusses of steel.
@@ -111,6 +121,11 @@ int CCodeHinges::Group(const T_CODE_REQUEST& request, std::vector<T_GROUP>& grou
             if (!refuse(id, reason)) return 0;
             continue;
         }
+        if (request.options.connection &&
+            !ReadSteelJoints(model, *request.options.connection, member, reason)) {
+            if (!refuse(id, reason)) return 0;
+            continue;
+        }
         if (const auto pushed = request.pushed.find(id); pushed != request.pushed.end())
             member.pushed = pushed->second;
         const std::vector<double> inputs = InputsOf(model, member);
@@ -181,19 +196,27 @@ void CCodeHinges::Warn(T_CODE_HINGES& out) const
         out.warnings.push_back({"IDS_QM_GEN_WARN_ACTING", {}});
 }
 
-int CCodeHinges::Preview(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
-                         T_HINGE_REFUSAL& refusal)
+/// The hinges of the request, the document as it is.
+int CCodeHinges::Make(const T_CODE_REQUEST& request, std::vector<T_GROUP>& groups,
+                      T_CODE_HINGES& out, T_HINGE_REFUSAL& refusal)
 {
     std::string reason;
     if (!Analyse(reason)) {
         refusal = RefusalOf(0, reason);
         return 0;
     }
+    if (!Group(request, groups, out, refusal)) return 0;
+    Warn(out);
+    out.types = groups.size();
+    return 1;
+}
+
+int CCodeHinges::Preview(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
+                         T_HINGE_REFUSAL& refusal)
+{
     T_CODE_HINGES made;
     std::vector<T_GROUP> groups;
-    if (!Group(request, groups, made, refusal)) return 0;
-    Warn(made);
-    made.types = groups.size();
+    if (!Make(request, groups, made, refusal)) return 0;
     out = std::move(made);
     return 1;
 }
@@ -201,16 +224,9 @@ int CCodeHinges::Preview(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
 int CCodeHinges::Generate(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
                           T_HINGE_REFUSAL& refusal)
 {
-    std::string reason;
-    if (!Analyse(reason)) {
-        refusal = RefusalOf(0, reason);
-        return 0;
-    }
     T_CODE_HINGES made;
     std::vector<T_GROUP> groups;
-    if (!Group(request, groups, made, refusal) || !Store(groups, request, refusal)) return 0;
-    Warn(made);
-    made.types = groups.size();
+    if (!Make(request, groups, made, refusal) || !Store(groups, request, refusal)) return 0;
     out = std::move(made);
     return 1;
 }
@@ -260,19 +276,13 @@ int CCodeHinges::Regenerate(T_CODE_HINGES& out, T_HINGE_REFUSAL& refusal)
     for (const auto& [key, type] : model.hingeTypes) {
         if (!type.generated || StateOf(key, text) != CODE_TYPE_STATE::Stale) continue;
         const T_GENERATED& made = *type.generated;
-        const auto code = std::ranges::find(kHingeCodeNames, made.code);
         T_CODE_REQUEST request;
-        request.options = {static_cast<HINGE_CODE>(code - kHingeCodeNames.begin()), made.secondary,
-                           made.tie, made.axialRange};
+        request.options = *OptionsOf(made); // a stale type has a code
         request.elements = ElementsWithHingeType(model, key);
         for (const int id : request.elements)
             if (!made.pushed.empty()) request.pushed[id] = made.pushed;
-        const auto alike = std::ranges::find_if(stale, [&](const T_CODE_REQUEST& other) {
-            return other.options.code == request.options.code &&
-                   other.options.secondary == request.options.secondary &&
-                   other.options.tie == request.options.tie &&
-                   other.options.axialRange == request.options.axialRange;
-        });
+        const auto alike = std::ranges::find_if(
+            stale, [&](const T_CODE_REQUEST& other) { return other.options == request.options; });
         if (alike == stale.end()) {
             stale.push_back(std::move(request));
             continue;
@@ -301,18 +311,18 @@ CODE_TYPE_STATE CCodeHinges::StateOf(int hingeType, std::string& text)
 {
     const T_MODEL& model = m_doc.Data().Model();
     const T_PHGT_D& type = model.hingeTypes.at(hingeType);
-    const auto code = std::ranges::find(kHingeCodeNames, type.generated->code);
+    const std::optional<T_CODE_OPTIONS> options = OptionsOf(*type.generated);
     const auto notChecked = [&text](std::string words) {
         text = std::move(words);
         return CODE_TYPE_STATE::NotChecked;
     };
-    if (code == kHingeCodeNames.end())
-        return notChecked(Say("IDS_QM_GEN_CODE", type.generated->code));
+    if (!options) return notChecked(Say("IDS_QM_GEN_CODE", type.generated->code));
     std::string reason;
     if (!Analyse(reason)) return notChecked(Say("IDS_QM_GEN_NOT_CHECKED", reason));
     T_HINGE_MEMBER member;
     for (const int id : ElementsWithHingeType(model, hingeType)) {
-        if (!ReadMember(model, id, m_axial, member, reason))
+        if (!ReadMember(model, id, m_axial, member, reason) ||
+            (options->connection && !ReadSteelJoints(model, *options->connection, member, reason)))
             return notChecked(Say("IDS_QM_GEN_NOT_CHECKED",
                                   Say("IDS_QM_HINGE_ELEMENT", std::to_string(id), reason)));
         member.pushed = type.generated->pushed;
@@ -323,10 +333,7 @@ CODE_TYPE_STATE CCodeHinges::StateOf(int hingeType, std::string& text)
     text.clear();
     if (member.element == 0) return CODE_TYPE_STATE::Fresh; // no element has it
     T_CODE_HINGE today;
-    const T_GENERATED& made = *type.generated;
-    const T_CODE_OPTIONS options{static_cast<HINGE_CODE>(code - kHingeCodeNames.begin()),
-                                 made.secondary, made.tie, made.axialRange};
-    if (!MakeCodeHinge(model, member, options, today, reason))
+    if (!MakeCodeHinge(model, member, *options, today, reason))
         return notChecked(Say("IDS_QM_GEN_NOT_CHECKED", reason));
     if (SameHinge(type, today.type)) return CODE_TYPE_STATE::Fresh;
     text = Say("IDS_QM_GEN_EDITED");

@@ -82,6 +82,8 @@ public:
 private:
     struct T_GROUP;
     int Analyse(std::string& reason);
+    int Make(const T_CODE_REQUEST& request, std::vector<T_GROUP>& groups, T_CODE_HINGES& out,
+             T_HINGE_REFUSAL& refusal);
     int Group(const T_CODE_REQUEST& request, std::vector<T_GROUP>& groups, T_CODE_HINGES& out,
               T_HINGE_REFUSAL& refusal);
     int Store(std::vector<T_GROUP>& groups, const T_CODE_REQUEST& request,

@@ -140,7 +140,9 @@ int BothEnds(const T_TASK& task, HINGE_COMPONENT component, const T_ENDS<double>
                      atI ? axial.I : axial.J);
     };
     if (!EndHinge(end(true), out.I, reason)) return 0;
-    const bool same = !task.member.HasAxial() || axial.I == axial.J;
+    const auto& joints = task.member.joints;
+    const bool same =
+        (!task.member.HasAxial() || axial.I == axial.J) && (!joints || joints->I == joints->J);
     if (same && task.member.pushed.empty()) {
         out.J = out.I;
         return 1;
@@ -336,7 +338,8 @@ int MakeCodeHinge(const T_MODEL& model, const T_HINGE_MEMBER& member, const T_CO
                                  InputsOf(model, member),
                                  member.pushed,
                                  options.axialRange,
-                                 options.tie};
+                                 options.tie,
+                                 member.joints ? options.connection : std::nullopt};
     out = std::move(hinge);
     return 1;
 }

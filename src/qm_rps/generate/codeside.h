@@ -1,14 +1,16 @@
 // What a code gives for one side of a component of a member end, and what it is made of. SI.
 #pragma once
 
+#include "qm_rps/codes/asce41connection.h"
 #include "qm_rps/codes/codebackbone.h"
 
 #include <array>
 #include <vector>
 
-enum class HINGE_CODE { Asce17, Asce13, Fema356, En1998, Circolare2019 };
-inline constexpr std::array<const char*, 5> kHingeCodeNames{"ASCE41-17", "ASCE41-13", "FEMA356",
-                                                            "EN1998-3", "Circolare2019"};
+/// Aisc342: columns of steel alone.
+enum class HINGE_CODE { Asce17, Asce13, Fema356, Aisc342, En1998, Circolare2019 };
+inline constexpr std::array<const char*, 6> kHingeCodeNames{
+    "ASCE41-17", "ASCE41-13", "FEMA356", "AISC342-22", "EN1998-3", "Circolare2019"};
 /// Chord rotations with DL, SD, NC; else plastic rotations with IO, LS, CP.
 inline bool IsChordCode(HINGE_CODE code)
 {
@@ -21,6 +23,8 @@ struct T_CODE_OPTIONS {
     bool secondary = false;           // members
     double tie = 0.0;                 // strength of what ties spandrels
     std::vector<double> axialRange{}; // from, to: FEMA curves at axial forces within; empty: none
+    std::optional<T_STEEL_CONNECTION> connection{}; // of steel beams, ASCE 41-17
+    bool operator==(const T_CODE_OPTIONS&) const = default;
 };
 
 /// What a member is to the codes. Steep (above 45 degrees): column, wall, pier; else beam,
@@ -56,6 +60,9 @@ struct T_MEMBER_END {
     double length = 0.0; // of the member in the model
     double tie = 0.0;    // of spandrels: strength of what ties the wall there; 0: nothing
     std::optional<T_PUSHED_SHEAR> pushed{}; // else V of both ends' strengths, shear span clear / 2
+
+    std::optional<T_STEEL_CONNECTION> connection{};
+    T_STEEL_JOINT joint{}; // of the connection
 
     double shearSpan = 0.0; // M / V of a state; 0: of `pushed`, or clear / 2
 

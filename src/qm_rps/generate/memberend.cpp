@@ -201,6 +201,10 @@ T_MEMBER_END EndOf(const T_MODEL& model, const T_HINGE_MEMBER& member,
     end.GA =
         m.G.value_or(m.E / (2.0 * (1.0 + m.nu))) * (end.aboutY ? end.section.Asz : end.section.Asy);
     end.length = member.length;
+    if (member.joints) {
+        end.connection = options.connection;
+        end.joint = atI ? member.joints->I : member.joints->J;
+    }
     const auto axis = std::ranges::find(member.bending, component) - member.bending.begin();
     const std::size_t place = 4 * static_cast<std::size_t>(axis) + (atI ? 0 : 2);
     if (place + 1 < member.pushed.size() && member.pushed[place] > 0.0)
@@ -226,6 +230,10 @@ std::vector<double> InputsOf(const T_MODEL& model, const T_HINGE_MEMBER& member)
     AppendMaterial(material, inputs);
     AppendSection(section, inputs);
     inputs.insert(inputs.end(), member.pushed.begin(), member.pushed.end());
+    if (!member.joints) return inputs;
+    for (const T_STEEL_JOINT& j : {member.joints->I, member.joints->J})
+        Append(inputs,
+               {j.columnFlange, j.columnDepth, j.columnWeb, j.columnFye, j.storey, j.beams});
     return inputs;
 }
 

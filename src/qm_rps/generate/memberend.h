@@ -15,6 +15,8 @@ struct T_HINGE_MEMBER {
     std::vector<HINGE_COMPONENT> bending; // about which axes
     T_ENDS<T_DIRS6> release{};
     std::vector<double> pushed{}; // as T_GENERATED has it
+    /// Of a steel beam with a connection; see ReadSteelJoints.
+    std::optional<T_ENDS<T_STEEL_JOINT>> joints{};
 
     bool HasAxial() const { return IsUpright(kind); }
 };

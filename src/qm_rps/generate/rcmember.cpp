@@ -137,6 +137,11 @@ std::optional<T_RC_MATERIAL> RcMaterial(const T_MATL_D& m, HINGE_CODE code, CCod
         sheet.Refuse(CODE_REASON::Missing, "type: concrete", m.name);
         return {};
     }
+    if (code == HINGE_CODE::Aisc342) {
+        sheet.Refuse(CODE_REASON::NoRow, "type: concrete",
+                     kHingeCodeNames[static_cast<std::size_t>(code)]);
+        return {};
+    }
     const T_MATL_MEAN mean = m.mean.value_or(T_MATL_MEAN{});
     T_RC_MATERIAL r;
     if (IsChordCode(code)) {

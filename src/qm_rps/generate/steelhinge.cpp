@@ -1,6 +1,7 @@
 #include "qm_rps/generate/steelhinge.h"
 
 #include "qm_base/say.h"
+#include "qm_rps/codes/asce41connection.h"
 #include "qm_rps/codes/en1993class.h"
 #include "qm_rps/codes/en1998steel.h"
 #include "qm_rps/codes/steelbuckling.h"
@@ -15,11 +16,12 @@ namespace {
 constexpr auto K = CODE_MARK::Computed;
 constexpr auto R = CODE_MARK::Recalled;
 
-ASCE_EDITION EditionOf(const T_MEMBER_END& end)
+/// AISC 342 has columns alone.
+bool HasRow(const T_MEMBER_END& end, CCodeSheet& sheet)
 {
-    if (end.code == HINGE_CODE::Asce17) return ASCE_EDITION::Asce17;
-    if (end.code == HINGE_CODE::Asce13) return ASCE_EDITION::Asce13;
-    return end.secondary ? ASCE_EDITION::Fema356Secondary : ASCE_EDITION::Fema356Primary;
+    return end.code != HINGE_CODE::Aisc342 || end.kind == MEMBER_KIND::Column ||
+           sheet.Refuse(CODE_REASON::NoRow, kMemberKindNames[static_cast<std::size_t>(end.kind)],
+                        kHingeCodeNames[static_cast<std::size_t>(end.code)]);
 }
 
 bool IsI(const T_STEEL_BASIS& in)
@@ -45,22 +47,64 @@ std::optional<double> ShearStrength(const T_STEEL_BASIS& in, CCodeSheet& sheet)
     return AiscShapeShear(s, in.end.aboutY, in.fy, in.E, sheet);
 }
 
+/// a, b, c of the connection with the factors of the joint; it has no acceptance values.
+std::optional<T_CODE_PLASTIC> ConnectionOf(const T_STEEL_BASIS& in, CCodeSheet& sheet)
+{
+    constexpr const char* kClause = "ASCE 41-17 9.4.2.4.3";
+    const T_STEEL_CONNECTION& asked = *in.end.connection;
+    const auto kind = std::ranges::find(kFrConnectionNames, asked.kind);
+    if (kind == kFrConnectionNames.end() || in.end.code != HINGE_CODE::Asce17) {
+        sheet.Refuse(CODE_REASON::NoRow, "connection " + asked.kind,
+                     kHingeCodeNames[static_cast<std::size_t>(in.end.code)]);
+        return {};
+    }
+    T_FR_CONNECTION c;
+    c.kind = static_cast<FR_CONNECTION>(kind - kFrConnectionNames.begin());
+    c.depth = in.shape.h;
+    c.span = in.end.clear;
+    c.flangeWidth = in.shape.b;
+    c.flangeThickness = in.shape.tf;
+    const bool given = asked.columnFlange > 0.0;
+    c.columnFlange = sheet.Put("tcf", given ? asked.columnFlange : in.end.joint.columnFlange,
+                               kDimLength, "", given ? "given" : "of the frame", K);
+    c.continuityPlate = asked.continuityPlate;
+    const auto panel = asked.panelRatio > 0.0
+                           ? std::optional(sheet.Put("Vpz/Vye", asked.panelRatio, "", "given", K))
+                           : AscePanelRatio(in.end.joint, c.depth, sheet);
+    if (!panel) return {};
+    c.panelRatio = *panel;
+    c.slenderShare = AsceSlenderShare(in.Member(), kClause, sheet);
+    sheet.Warn("IDS_QM_GEN_WARN_PANEL", {CodeNumber(*panel)});
+    if (c.kind == FR_CONNECTION::ReducedBeamSection) sheet.Warn("IDS_QM_GEN_WARN_RBS", {});
+    return AsceConnection(c, sheet);
+}
+
+/// A column by its axial force.
+std::optional<T_STEEL_PLASTIC> ColumnRow(const T_STEEL_BASIS& in, CCodeSheet& sheet)
+{
+    T_STEEL_MEMBER m = in.Member();
+    if (in.end.code == HINGE_CODE::Aisc342) return Aisc342Column(m, sheet);
+    if (in.end.code != HINGE_CODE::Asce17) {
+        const auto strength = AiscBuckling(BucklingOf(in, in.lower), sheet);
+        if (!strength) return {};
+        m.axialStrength =
+            sheet.Put("P_CL", *strength, kDimForce, "ASCE 41-13 9.4.2.3.2", "Pn with Fy", R);
+    }
+    return AsceSteelColumn(m, SteelEdition(in.end), sheet);
+}
+
+std::optional<T_STEEL_PLASTIC> AsceRow(const T_STEEL_BASIS& in, CCodeSheet& sheet)
+{
+    if (in.end.kind == MEMBER_KIND::Column) return ColumnRow(in, sheet);
+    if (!in.end.connection) return AsceSteelBeam(in.Member(), SteelEdition(in.end), sheet);
+    const std::optional<T_CODE_PLASTIC> of = ConnectionOf(in, sheet);
+    return of ? std::optional(T_STEEL_PLASTIC{0.0, *of, false}) : std::nullopt;
+}
+
 std::optional<T_CODE_BACKBONE> AsceBending(const T_STEEL_BASIS& in, const T_CODE_SIDE& side,
                                            CCodeSheet& sheet)
 {
-    T_STEEL_MEMBER m = in.Member();
-    std::optional<T_STEEL_PLASTIC> found;
-    if (in.end.kind == MEMBER_KIND::Column) {
-        if (in.end.code != HINGE_CODE::Asce17) {
-            const auto strength = AiscBuckling(BucklingOf(in, in.lower), sheet);
-            if (!strength) return {};
-            m.axialStrength =
-                sheet.Put("P_CL", *strength, kDimForce, "ASCE 41-13 9.4.2.3.2", "Pn with Fy", R);
-        }
-        found = AsceSteelColumn(m, EditionOf(in.end), sheet);
-    } else {
-        found = AsceSteelBeam(m, EditionOf(in.end), sheet);
-    }
+    const std::optional<T_STEEL_PLASTIC> found = AsceRow(in, sheet);
     if (!found) return {};
     T_BACKBONE_IN curve;
     curve.yield = side.strength;
@@ -69,6 +113,7 @@ std::optional<T_CODE_BACKBONE> AsceBending(const T_STEEL_BASIS& in, const T_CODE
                   "My L/(6 EI), EI of the model", K);
     curve.slope = sheet.Put("slope B-C", kSteelSlope, "ASCE 41-17 9.4.2.2", "of the elastic slope",
                             CODE_MARK::SightedOnce);
+    curve.acceptance = in.end.kind == MEMBER_KIND::Column || !in.end.connection;
     auto bone = BackboneOfPlastic(found->plastic, curve, sheet);
     if (bone) bone->forceControlled = bone->forceControlled || found->forceControlled;
     return bone;
@@ -188,7 +233,7 @@ int BraceSide(const T_MEMBER_END& end, bool tension, T_CODE_SIDE& side, std::str
 {
     CCodeSheet sheet;
     const std::optional<T_STEEL_BASIS> in = SteelBasis(end, sheet);
-    if (!in) return Fail(sheet, reason);
+    if (!in || !HasRow(end, sheet)) return Fail(sheet, reason);
     const auto strength =
         tension ? std::optional(sheet.Put("Ny", in->strength.Npl, kDimForce, "", "A fy", K))
                 : BuckledStrength(*in, sheet);
@@ -209,7 +254,7 @@ int SteelHinge(const T_MEMBER_END& end, T_SIDES<T_CODE_SIDE>& out, std::string& 
 {
     CCodeSheet sheet, atZero;
     const std::optional<T_STEEL_BASIS> in = SteelBasis(end, sheet);
-    if (!in || !sheet.Positive({{"EI", end.EI}})) return Fail(sheet, reason);
+    if (!in || !HasRow(end, sheet) || !sheet.Positive({{"EI", end.EI}})) return Fail(sheet, reason);
     if (!IsChordCode(end.code) && !IsI(*in)) {
         sheet.Refuse(CODE_REASON::NoRow, "shape: I", "ASCE 41 Tables 9-6, 9-7.1");
         return Fail(sheet, reason);
@@ -256,9 +301,9 @@ std::optional<T_PMM_TABLE> SteelAxialCurve(const std::vector<T_MEMBER_END>& ends
         const double a = std::clamp((in->shape.A - 2.0 * in->shape.b * in->shape.tf) / in->shape.A,
                                     0.0, 0.5); // 6.2.9.1(5)
         // Where the formulas bend.
-        const double corner = IsChordCode(end.code)            ? (end.aboutY ? 0.5 * a : a)
-                              : end.code == HINGE_CODE::Asce17 ? 0.2
-                                                               : 1.0 - 1.0 / 1.18;
+        const double corner = IsChordCode(end.code) ? (end.aboutY ? 0.5 * a : a)
+                              : SteelEdition(end) == ASCE_EDITION::Asce17 ? 0.2
+                                                                          : 1.0 - 1.0 / 1.18;
         const std::size_t axis = end.aboutY ? 0 : 1;
         const auto forces =
             AxialForces(full, -full, {0.0, corner * full, -corner * full, given.I, given.J},

@@ -94,14 +94,24 @@ std::optional<T_STEEL_BASIS> SteelBasis(const T_MEMBER_END& end, CCodeSheet& she
     return in;
 }
 
+ASCE_EDITION SteelEdition(const T_MEMBER_END& end)
+{
+    switch (end.code) {
+    case HINGE_CODE::Asce13:
+        return ASCE_EDITION::Asce13;
+    case HINGE_CODE::Fema356:
+        return end.secondary ? ASCE_EDITION::Fema356Secondary : ASCE_EDITION::Fema356Primary;
+    default:
+        return ASCE_EDITION::Asce17;
+    }
+}
+
 std::optional<double> SteelMoment(const T_STEEL_BASIS& in, double axial, CCodeSheet& sheet)
 {
     if (!IsChordCode(in.end.code)) {
         T_STEEL_MEMBER m = in.Member();
         m.axial = axial;
-        return AsceSteelMoment(
-            m, in.end.code == HINGE_CODE::Asce17 ? ASCE_EDITION::Asce17 : ASCE_EDITION::Asce13,
-            sheet);
+        return AsceSteelMoment(m, SteelEdition(in.end), sheet);
     }
     const auto reduced = EnAxialBending(in.shape, in.strength, {axial, 0.0, 0.0}, sheet);
     if (!reduced) return {};

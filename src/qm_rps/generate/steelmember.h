@@ -29,5 +29,8 @@ std::optional<T_STEEL_SHAPE> SteelShapeOf(const T_SECT_D& section, bool fillets,
 /// factor. Refuses other shapes and materials.
 std::optional<T_STEEL_BASIS> SteelBasis(const T_MEMBER_END& end, CCodeSheet& sheet);
 
+/// The edition of ASCE 41 whose rules hold; AISC 342 takes the strengths of 41-17.
+ASCE_EDITION SteelEdition(const T_MEMBER_END& end);
+
 /// Plastic moment with an axial force of either sign: ASCE 41, or EN 1993-1-1 6.2.9.
 std::optional<double> SteelMoment(const T_STEEL_BASIS& in, double axial, CCodeSheet& sheet);

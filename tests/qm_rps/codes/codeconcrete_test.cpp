@@ -277,7 +277,7 @@ TEST(CodeSheet, RefusesWithMemberAndReason)
          [](S& s) { return !BackboneOfChord({0.01, 0.006, 0.008, 0}, {1.0, 0.01}, s); }},
         {"axial",          OutOfRange,
          [&](S& s) { return !AsceSteelColumn(steel, ASCE_EDITION::Asce17, s); }},
-        {"highlyDuctile",  NoRow,
+        {"bf/2tf",         OutOfRange,
          [&](S& s) { return !Aisc342Column(brittle, s); }},
         {"axialRatio",     OutOfRange,
          [](S& s) { return !EnSteelLimits({STEEL_ACTION::Bending, 1, 0.31, 0.01}, s); }},
