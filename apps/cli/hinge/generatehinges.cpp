@@ -15,11 +15,6 @@
 
 namespace {
 
-std::string Number(double value)
-{
-    return FormatText("%.5g", value);
-}
-
 /// Plastic rotations and chord rotations have tables of their own.
 std::string Table(const T_CODE_HINGES& hinges, bool chord, const T_UNITS& units)
 {
