@@ -307,6 +307,7 @@ TEST(SteelClass, WorstPartOfTable52)
         T_STEEL_SHAPE s;
         s.shape = kind;
         s.h = 0.3, s.b = b, s.tf = tf, s.tw = tw;
+        s.A = 2 * b * tf + (0.3 - 2 * tf) * tw; // of an I
         return s;
     };
     using enum STEEL_SHAPE;
@@ -324,6 +325,11 @@ TEST(SteelClass, WorstPartOfTable52)
         // N over the whole web: 396/(13 - 1) = 33.
         {"web 28, N", shape(WeldedI, 0.1, 0.01, 0.01), true, 1e6, 1, 1},
         {"web 35, N: 33 and 38", shape(WeldedI, 0.1, 0.01, 0.008), true, 1e6, 2, 2},
+        // A fy = 733.2 kN: a = 0.595 gives 58.8 and 67.7, psi = -0.864 gives 109.1.
+        {"web 70, little N", shape(WeldedI, 0.1, 0.01, 0.004), true, 50e3, 3, 4},
+        // A fy = 601.6 kN, tension: a = 0.310 gives 116.1 and 133.8, psi = -1.166 gives 145.0.
+        {"web 140, tension", shape(WeldedI, 0.1, 0.01, 0.002), true, -50e3, 3, 4},
+        {"web 140: 124", shape(WeldedI, 0.1, 0.01, 0.002), true, 0.0, 4, 4},
         {"web 70 in the middle, about z", shape(WeldedI, 0.1, 0.01, 0.004), false, 0.0, 1, 4},
         {"the same with N", shape(WeldedI, 0.1, 0.01, 0.004), false, 1e3, 4, 4},
         {"box: flange (350 - 20)/10 = 33", shape(RectangularTube, 0.35, 0.01, 0.01), true, 0.0, 1,
@@ -338,6 +344,10 @@ TEST(SteelClass, WorstPartOfTable52)
         EXPECT_EQ(c.bent, En1993Class(c.shape, c.aboutY, c.axial, fy, sheet)) << c.label;
         EXPECT_EQ(c.pressed, En1993ClassCompressed(c.shape, fy, sheet)) << c.label;
     }
+    // IPE 300, S275, 100 kN: a = 0.592, web 35.0 below 396 0.924/(13 a - 1) = 54.7, flange 5.3.
+    const T_STEEL_SHAPE ipe{RolledI, 53.81e-4, 0.3, 0.15, 10.7e-3, 7.1e-3, 15e-3};
+    CCodeSheet sheet;
+    EXPECT_EQ(1, En1993Class(ipe, true, 100e3, 275e6, sheet));
 }
 
 TEST(SteelBuckling, CurvesOfBothCodes)
