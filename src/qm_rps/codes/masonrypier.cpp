@@ -79,8 +79,9 @@ double RegularStrength(const T_PIER& p, double stress, CCodeSheet& sheet)
 
 double NtcSliding(const T_PIER& p, CCodeSheet& sheet)
 {
-    return SlidingStrength(p, 0.065 * p.fb / kGammaM, kSliding,
-                           "l' t min(fv0 + 0.4 N/(l' t); 0.065 fb/0.7); l' >= 0", S1, sheet);
+    return SlidingStrength(p, 0.065 * p.fb / kGammaM / p.confidence, kSliding,
+                           "l' t min(fv0/CF + 0.4 N/(l' t); 0.065 fb/(0.7 CF)); l' >= 0", S1,
+                           sheet);
 }
 
 bool SoundPier(const T_PIER& p, CCodeSheet& sheet)
@@ -131,6 +132,7 @@ std::optional<T_PIER_STRENGTH> NtcPier(const T_PIER& pier, CCodeSheet& sheet)
     const auto take = [&](PIER_MODE mode, double v) {
         if (v < s.strength) s.mode = mode, s.strength = v;
     };
+    if (pier.fv0 > 0.0 && !(pier.fb > 0.0)) sheet.Warn("IDS_QM_CODE_WARN_NO_FB", {});
     if (pier.fv0 > 0.0) take(PIER_MODE::Sliding, *(s.sliding = NtcSliding(pier, sheet)));
     s.diagonal = pier.bond == MASONRY_BOND::Regular ? RegularStrength(pier, stress, sheet)
                                                     : IrregularStrength(pier, stress, sheet);
