@@ -90,10 +90,10 @@ std::vector<std::string> HingeRowHeads(const T_CODE_HINGES& hinges, bool chord,
                                        const T_UNITS& units)
 {
     const std::string force(NameOf(units.force)), moment = UnitText(kDimMoment, units);
-    bool forces = false; // not moments alone
+    bool forces = false, moments = false;
     for (const T_CODE_ELEMENT& element : hinges.elements)
         for (const T_CODE_COMPONENT& c : element.hinge->components)
-            forces = forces || c.component < HINGE_COMPONENT::Mx;
+            (c.component < HINGE_COMPONENT::Mx ? forces : moments) = true;
     std::vector<std::string> heads{
         Say("IDS_QM_GEN_END"),
         Say("IDS_QM_GEN_AXIS"),
@@ -101,10 +101,14 @@ std::vector<std::string> HingeRowHeads(const T_CODE_HINGES& hinges, bool chord,
         "N (" + force + ")",
         forces ? "F, M (" + UnitText(kDimForce, units) + ", " + moment + ")" : "M (" + moment + ")",
         "V/Vn"};
+    const std::string lengths = UnitText(kDimLength, units);
+    const std::string unit = !forces ? "rad" : moments ? "rad, " + lengths : lengths;
     const std::vector<std::string> more =
-        chord ? std::vector<std::string>{"theta_y", "DL", "SD", "NC"}
-              : std::vector<std::string>{"a", "b", "c", "IO", "LS", "CP"};
-    heads.insert(heads.end(), more.begin(), more.end());
+        chord
+            ? std::vector<std::string>{forces && !moments ? "Delta_y" : "theta_y", "DL", "SD", "NC"}
+            : std::vector<std::string>{"a", "b", "c", "IO", "LS", "CP"};
+    for (const std::string& head : more)
+        heads.push_back(head == "c" ? head : head + " (" + unit + ")");
     return heads;
 }
 
