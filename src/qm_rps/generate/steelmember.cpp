@@ -39,17 +39,16 @@ std::optional<double> Yield(const T_MEMBER_END& end, double& lower, CCodeSheet& 
 
 } // namespace
 
-std::optional<T_STEEL_SHAPE> SteelShapeOf(const T_SECT_D& s, bool fillets, CCodeSheet& sheet)
+std::optional<T_STEEL_SHAPE> SteelShapeOf(const T_SECT_D& s, CCodeSheet& sheet)
 {
     const auto& [a, b, c, d] = s.size;
-    const double r = fillets ? s.fillet : 0.0;
+    const double r = s.fillet;
     switch (s.shape) {
     case SECT_SHAPE::IShape:
         return T_STEEL_SHAPE{
             r > 0.0 ? STEEL_SHAPE::RolledI : STEEL_SHAPE::WeldedI, s.area, a, b, d, c, r};
     case SECT_SHAPE::Box:
-        return T_STEEL_SHAPE{STEEL_SHAPE::RectangularTube,  s.area, a, b, d, c,
-                             fillets ? InnerRadius(s) : 0.0};
+        return T_STEEL_SHAPE{STEEL_SHAPE::RectangularTube, s.area, a, b, d, c, InnerRadius(s)};
     case SECT_SHAPE::Pipe:
         return T_STEEL_SHAPE{STEEL_SHAPE::CircularTube, s.area, a, a, b, b, 0.0};
     default:
@@ -80,7 +79,7 @@ std::optional<T_STEEL_BASIS> SteelBasis(const T_MEMBER_END& end, CCodeSheet& she
 {
     double lower = 0.0;
     const std::optional<double> fy = Yield(end, lower, sheet);
-    const auto shape = fy ? SteelShapeOf(end.section, false, sheet) : std::nullopt;
+    const auto shape = fy ? SteelShapeOf(end.section, sheet) : std::nullopt;
     const T_SECT_D& s = end.section;
     if (!shape || !sheet.Positive({{"E", end.material.E}, {"clear length", end.clear}})) return {};
     T_STEEL_BASIS in{end, *shape, {s.area * *fy, s.Zy * *fy, s.Zz * *fy}, *fy, lower};

@@ -21,10 +21,10 @@ struct T_STEEL_BASIS {
     T_STEEL_MEMBER Member() const;
 };
 
-/// I, box or pipe; other shapes are refused. Without `fillets` the plates count as welded.
-std::optional<T_STEEL_SHAPE> SteelShapeOf(const T_SECT_D& section, bool fillets, CCodeSheet& sheet);
+/// I, box or pipe with its fillet: an I without one is welded; other shapes are refused.
+std::optional<T_STEEL_SHAPE> SteelShapeOf(const T_SECT_D& section, CCodeSheet& sheet);
 
-/// Plates are taken as welded, without fillets. ASCE 41: the material's mean, else Fy times the
+/// ASCE 41: the material's mean, else Fy times the
 /// factor of Table 9-3. EN 1998-3, Circolare: the mean, else Fy with a warning, over the confidence
 /// factor. Refuses other shapes and materials.
 std::optional<T_STEEL_BASIS> SteelBasis(const T_MEMBER_END& end, CCodeSheet& sheet);

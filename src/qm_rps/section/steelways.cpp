@@ -25,7 +25,7 @@ struct T_STEEL_CHECK {
 std::optional<T_STEEL_CHECK> CheckOf(const T_CHECK_JOB& job, CCodeSheet& sheet)
 {
     const T_SECT_D& s = job.section;
-    const auto shape = SteelShapeOf(s, true, sheet);
+    const auto shape = SteelShapeOf(s, sheet);
     if (!shape) return {};
     const double fy = job.strengths.fy;
     T_STEEL_CHECK c{*shape, {s.area * fy, s.Zy * fy, s.Zz * fy}, fy, job.strengths.E};
@@ -119,7 +119,7 @@ std::optional<double> EnBending(const T_CHECK_JOB& job, const T_SECTION_FORCES& 
 std::optional<double> EnShearAlong(const T_CHECK_JOB& job, double shear, bool alongDepth,
                                    CCodeSheet& sheet)
 {
-    const auto shape = SteelShapeOf(job.section, true, sheet);
+    const auto shape = SteelShapeOf(job.section, sheet);
     const auto area = shape ? EnShearArea(*shape, alongDepth, sheet) : std::nullopt;
     const auto strength = area ? EnPlasticShear(*area, job.strengths.fy, sheet) : std::nullopt;
     if (!strength) return {};
@@ -154,7 +154,7 @@ std::optional<double> AiscShearAlong(const T_CHECK_JOB& job, double shear, bool 
                                      CCodeSheet& sheet)
 {
     if (!NotDesign(job, sheet)) return {};
-    const auto shape = SteelShapeOf(job.section, true, sheet);
+    const auto shape = SteelShapeOf(job.section, sheet);
     if (!shape) return {};
     const auto strength =
         AiscShapeShear(*shape, alongDepth, job.strengths.fy, job.strengths.E, sheet);
