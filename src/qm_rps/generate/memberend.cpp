@@ -13,6 +13,9 @@ namespace {
 
 using T_VECTOR = std::array<double, 3>;
 constexpr double kSameAxial = 1e-6; // of the squash load
+/// Of the rules by which hinges are made, raised where a rule changes what comes out: a type of an
+/// earlier edition is stale, not edited.
+constexpr double kEdition = 2.0;
 constexpr auto kMy = HINGE_COMPONENT::My, kMz = HINGE_COMPONENT::Mz;
 
 double Dot(const T_VECTOR& a, const T_VECTOR& b)
@@ -109,6 +112,11 @@ double SquashLoad(const T_SECT_D& section, const T_MATL_D& material)
                                                         : std::max(material.fck, mean.fc));
 }
 
+double ShearModulus(const T_MATL_D& m)
+{
+    return m.G.value_or(m.E / (2.0 * (1.0 + m.nu)));
+}
+
 void Append(std::vector<double>& to, std::initializer_list<double> values)
 {
     to.insert(to.end(), values);
@@ -117,7 +125,7 @@ void Append(std::vector<double>& to, std::initializer_list<double> values)
 void AppendMaterial(const T_MATL_D& m, std::vector<double>& to)
 {
     const T_MATL_MEAN mean = m.mean.value_or(T_MATL_MEAN{});
-    Append(to, {m.E, m.fck, m.fyk, m.Es, mean.fc, mean.fy, mean.fyw});
+    Append(to, {m.E, ShearModulus(m), m.fck, m.fyk, m.Es, mean.fc, mean.fy, mean.fyw});
     Append(to,
            {m.confidence.value_or(0.0), m.knowledge ? 1.0 + static_cast<int>(*m.knowledge) : 0.0});
     if (m.type == MATL_CLASS::Steel) Append(to, {m.Fy});
@@ -133,7 +141,7 @@ void AppendSection(const T_SECT_D& s, std::vector<double>& to)
     Append(to, {1.0 * d.legsY, 1.0 * d.legsZ, 1.0 * static_cast<int>(d.hooks),
                 d.tiesInCore ? 1.0 : 0.0, d.poorSplice ? 1.0 : 0.0});
     if (s.shape != SECT_SHAPE::Rectangle)
-        Append(to, {1.0 * static_cast<int>(s.shape), s.size[2], s.size[3]});
+        Append(to, {1.0 * static_cast<int>(s.shape), s.size[2], s.size[3], s.fillet});
     for (const T_REBAR& bar : s.bars)
         Append(to, {bar.y, bar.z, bar.area});
 }
@@ -198,8 +206,7 @@ T_MEMBER_END EndOf(const T_MODEL& model, const T_HINGE_MEMBER& member,
     const T_MATL_D& m = end.material;
     end.EI = m.E * (end.aboutY ? end.section.Iyy : end.section.Izz);
     end.EA = m.E * end.section.area;
-    end.GA =
-        m.G.value_or(m.E / (2.0 * (1.0 + m.nu))) * (end.aboutY ? end.section.Asz : end.section.Asy);
+    end.GA = ShearModulus(m) * (end.aboutY ? end.section.Asz : end.section.Asy);
     end.length = member.length;
     if (member.joints) {
         end.connection = options.connection;
@@ -221,7 +228,7 @@ std::vector<double> InputsOf(const T_MODEL& model, const T_HINGE_MEMBER& member)
     std::vector<double> inputs;
     for (const double force : {member.axial.I, member.axial.J})
         inputs.push_back(member.HasAxial() && squash > 0.0 ? force / squash : 0.0);
-    Append(inputs, {static_cast<double>(member.kind), member.clear, member.length});
+    Append(inputs, {kEdition, static_cast<double>(member.kind), member.clear, member.length});
     for (const HINGE_COMPONENT c : {kMy, kMz}) {
         const auto at = static_cast<std::size_t>(c);
         Append(inputs, {member.release.I[at] ? 1.0 : 0.0, member.release.J[at] ? 1.0 : 0.0});
