@@ -73,4 +73,37 @@ TEST_F(CodeMasonry, MasonryTurnsAndSlides)
                         "Element 1: masonry: ASCE41-17 has no row");
 }
 
+TEST_F(CodeMasonry, BlocksLimitSlidingAndOffsetsDoNotBend)
+{
+    json file = Masonry();
+    // Rigid ends leave the spandrel 1.5 m and the pier 3.0 m, whatever lies between their nodes.
+    file["nodes"][1]["xyz"] = {0, 0, 4};
+    file["nodes"][3]["xyz"] = {12, 0, 0};
+    file["elements"][0]["offset"] = {{"I", {0, 0, 0.3}}, {"J", {0, 0, -0.7}}};
+    file["elements"][1]["offset"] = {{"I", {0.5, 0, 0}}, {"J", {-1, 0, 0}}};
+    const auto generate = [&](const std::string& options) {
+        Write("c.json", file.dump(1));
+        return Json("hinge generate c.json -o g.json --overwrite --code Circolare2019 " + options);
+    };
+    json r = generate("--elements 2 --tie 50");
+    const double tied = 50 * 0.4 * (1 - 50 / (0.85 * 3450 * 0.4));
+    ExpectHinge(HingeOf(r, "My", "+-"),
+                {{"moment", tied}, {"y", tied * 1.5 / (6 * 1.5e6 * 0.5 * 0.512 / 12)}}, 1e-9,
+                "spandrel");
+    r = generate("--elements 1");
+    ExpectHinge(HingeOf(r, "My", "+-"), {{"y", 172.059 * 3 / (6 * 2e6 * 0.084375)}}, 1e-4, "pier");
+    EXPECT_EQ(3.0, json::parse(Text("g.json"))["hinge_types"][0]["length"]["span"]);
+    EXPECT_EQ(std::string::npos, Done("hinge check g.json").find("generated"));
+    ExpectHolds(
+        Done("hinge generate c.json --elements 1 --code Circolare2019 -o g.json --overwrite"),
+        "fb of the blocks is not given");
+    // 0.065 1000/(0.7 1.2) = 77.38 kPa: 1.5 0.45 77.38/(1 + 1.35 77.38/300), less than the
+    // diagonal.
+    file["materials"][0]["masonry"]["fb"] = 1000;
+    r = generate("--elements 1");
+    const double limit = 65 / 0.84;
+    ExpectHinge(HingeOf(r, "Fz", "+-"), {{"force", 0.675 * limit / (1 + 0.0045 * limit)}}, 1e-9,
+                "blocks");
+}
+
 } // namespace

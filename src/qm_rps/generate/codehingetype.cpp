@@ -248,6 +248,9 @@ void Fill(const T_HINGE_MEMBER& member, bool chord, T_CODE_HINGE& hinge)
             b.component == HINGE_COMPONENT::My ? type.length.My : type.length.Mz;
         length = {b.ends.I.pos.hingeLength, b.ends.J.pos.hingeLength};
     }
+    if (member.length - member.clear <= 1e-9 * member.length) return;
+    type.length.autoSpan = false; // the elastic part is that between the rigid offsets
+    type.length.span = member.clear;
 }
 
 /// The strengths of bending by axial force.
@@ -276,6 +279,7 @@ public:
         for (T_HINGE_COMPONENT& c : type.components)
             for (T_SKEL_CURVE* curve : {&c.curves.I, &c.curves.J})
                 std::visit([this](auto& filled) { Add(filled); }, *curve);
+        numbers.push_back(&type.length.span);
         for (T_ENDS<double>* length : {&type.length.My, &type.length.Mz})
             numbers.insert(numbers.end(), {&length->I, &length->J});
         if (!type.pmm) return;

@@ -52,13 +52,12 @@ struct T_MEMBER_END {
     bool aboutY = true;
     T_SECT_D section; // with its properties
     T_MATL_D material;
-    double clear = 0.0;  // length between the offsets
-    double axial = 0.0;  // compression positive
-    double EI = 0.0;     // of the model: up to yield it bends with 6 EI / length
-    double EA = 0.0;     // of the model
-    double GA = 0.0;     // of the model, across the axis of bending; 0: no shear deformation
-    double length = 0.0; // of the member in the model
-    double tie = 0.0;    // of spandrels: strength of what ties the wall there; 0: nothing
+    double clear = 0.0; // length between the offsets
+    double axial = 0.0; // compression positive
+    double EI = 0.0;    // of the model: up to yield it bends with 6 EI / clear
+    double EA = 0.0;    // of the model
+    double GA = 0.0;    // of the model, across the axis of bending; 0: no shear deformation
+    double tie = 0.0;   // of spandrels: strength of what ties the wall there; 0: nothing
     std::optional<T_PUSHED_SHEAR> pushed{}; // else V of both ends' strengths, shear span clear / 2
 
     std::optional<T_STEEL_CONNECTION> connection{};
@@ -72,6 +71,9 @@ struct T_MEMBER_END {
         return pushed ? pushed->shearSpan : clear / 2.0;
     }
     bool HasAxial() const { return IsUpright(kind); }
+    /// Rotation of an end at a moment, with the same moment at the other: what bends elastically
+    /// lies between the rigid offsets.
+    double Turn(double moment) const { return moment * clear / (6.0 * EI); }
     /// Displacement of one end across the other under a shear force, bent by equal end moments.
     double Sway(double shear) const
     {

@@ -157,8 +157,8 @@ int MasonryHinge(const T_MEMBER_END& end, T_SIDES<T_CODE_SIDE>& out, std::string
     side.shearStrength = strengths->shear;
     side.shear = ShearOf(end, 2.0 * side.strength / end.clear, sheet);
     side.hingeLength = DepthOf(end);
-    const double turn = sheet.Put("theta_y", side.strength * end.length / (6.0 * end.EI), "",
-                                  "Mu L/(6 EI), EI of the model", K);
+    const double turn = sheet.Put("theta_y", end.Turn(side.strength), "",
+                                  "Mu L/(6 EI), EI of the model, clear length", K);
     const double sway = sheet.Put("Delta_y", end.Sway(strengths->shear), kDimLength, "",
                                   "V L^3/(12 EI) + V L/(G Av) of the model", K);
     const auto bending = CurveOf(strengths->bending, strengths->moment, turn, 1.0, kDimNone, sheet);

@@ -207,7 +207,6 @@ T_MEMBER_END EndOf(const T_MODEL& model, const T_HINGE_MEMBER& member,
     end.EI = m.E * (end.aboutY ? end.section.Iyy : end.section.Izz);
     end.EA = m.E * end.section.area;
     end.GA = ShearModulus(m) * (end.aboutY ? end.section.Asz : end.section.Asy);
-    end.length = member.length;
     if (member.joints) {
         end.connection = options.connection;
         end.joint = atI ? member.joints->I : member.joints->J;

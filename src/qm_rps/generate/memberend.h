@@ -10,7 +10,7 @@
 struct T_HINGE_MEMBER {
     int element = 0, section = 0, material = 0;
     MEMBER_KIND kind = MEMBER_KIND::Beam;
-    double clear = 0.0, length = 0.0;
+    double clear = 0.0, length = 0.0;     // between the rigid offsets, from node to node
     T_ENDS<double> axial{};               // compression positive
     std::vector<HINGE_COMPONENT> bending; // about which axes
     T_ENDS<T_DIRS6> release{};
@@ -36,7 +36,7 @@ T_MEMBER_END EndOf(const T_MODEL& model, const T_HINGE_MEMBER& member,
                    const T_CODE_OPTIONS& options, HINGE_COMPONENT component, bool atI,
                    double axial);
 
-/// All that a hinge type hangs on, in a fixed order.
+/// All that a hinge type hangs on, in a fixed order; the edition of the rules among it.
 std::vector<double> InputsOf(const T_MODEL& model, const T_HINGE_MEMBER& member);
 /// Equal but for rounding; axial forces to 1e-6 of the squash load.
 bool SameInputs(const std::vector<double>& a, const std::vector<double>& b);

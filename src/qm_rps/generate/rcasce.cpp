@@ -187,7 +187,7 @@ std::optional<T_CODE_BACKBONE> AsceBackbone(const T_RC_BASIS& in, T_CODE_SIDE& s
     }
     T_BACKBONE_IN curve;
     curve.yield = side.strength;
-    curve.yieldDeform = sheet.Put("theta_y", side.strength * in.end.length / (6.0 * in.end.EI), "",
-                                  "My L/(6 EI), EI of the model", K);
+    curve.yieldDeform = sheet.Put("theta_y", in.end.Turn(side.strength), "",
+                                  "My L/(6 EI), EI of the model, clear length", K);
     return BackboneOfPlastic(*plastic, curve, sheet);
 }

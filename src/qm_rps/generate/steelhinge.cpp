@@ -108,9 +108,8 @@ std::optional<T_CODE_BACKBONE> AsceBending(const T_STEEL_BASIS& in, const T_CODE
     if (!found) return {};
     T_BACKBONE_IN curve;
     curve.yield = side.strength;
-    curve.yieldDeform =
-        sheet.Put("theta_y (model)", side.strength * in.end.length / (6.0 * in.end.EI), "",
-                  "My L/(6 EI), EI of the model", K);
+    curve.yieldDeform = sheet.Put("theta_y (model)", in.end.Turn(side.strength), "",
+                                  "My L/(6 EI), EI of the model, clear length", K);
     curve.slope = sheet.Put("slope B-C", kSteelSlope, "ASCE 41-17 9.4.2.2", "of the elastic slope",
                             CODE_MARK::SightedOnce);
     curve.acceptance = in.end.kind == MEMBER_KIND::Column || !in.end.connection;
