@@ -10,15 +10,16 @@
 namespace {
 
 constexpr auto K = CODE_MARK::Computed;
-constexpr double kSameRow = 0.1; // of the depth
+constexpr double kSameRow = 0.1;   // of the depth
+constexpr double kRounding = 1e-6; // of the depth: a bar there lies on the edge of its row
 
 /// Bars of one row: area and first moment of their depths.
 struct T_ROW_SUM {
     double area = 0.0, moment = 0.0, largest = 0.0;
-    void Add(double bar, double depth)
+    void Add(double bar, double depth, double share = 1.0)
     {
-        area += bar;
-        moment += bar * depth;
+        area += share * bar;
+        moment += share * bar * depth;
         largest = std::max(largest, bar);
     }
 };
@@ -53,23 +54,31 @@ T_RC_MATERIAL Divided(const T_MATL_MEAN& mean, double factor, CCodeSheet& sheet)
     return r;
 }
 
-/// Tension and compression steel and their depths. Of a circle the bars of either half count.
+/// Tension and compression steel and their depths. Of a circle the bars of either half count; one
+/// on the axis of bending counts half to each.
 bool PutBars(const T_SECT_D& s, bool aboutY, bool positive, T_RC_BENDING& r, CCodeSheet& sheet)
 {
     std::vector<double> depths; // from the compressed edge
     for (const T_REBAR& bar : s.bars)
         depths.push_back(0.5 * r.h - (positive ? 1.0 : -1.0) * (aboutY ? bar.z : bar.y));
     const auto [first, last] = std::ranges::minmax(depths);
+    const double rounding = kRounding * r.h;
     const double least = r.round ? 0.5 * r.h : last - kSameRow * r.h;
     const double most = r.round ? 0.5 * r.h : first + kSameRow * r.h;
     T_ROW_SUM tension, compression;
-    for (std::size_t i = 0; i < depths.size(); ++i)
-        if (depths[i] >= least)
-            tension.Add(s.bars[i].area, depths[i]);
-        else if (depths[i] <= most)
-            compression.Add(s.bars[i].area, depths[i]);
-        else
-            r.AsWeb += s.bars[i].area;
+    for (std::size_t i = 0; i < depths.size(); ++i) {
+        const double area = s.bars[i].area, depth = depths[i];
+        if (r.round && std::fabs(depth - 0.5 * r.h) <= rounding) {
+            tension.Add(area, depth, 0.5);
+            compression.Add(area, depth, 0.5);
+        } else if (depth >= least - rounding) {
+            tension.Add(area, depth);
+        } else if (depth <= most + rounding) {
+            compression.Add(area, depth);
+        } else {
+            r.AsWeb += area;
+        }
+    }
     if (!sheet.Positive({{"As", tension.area}, {"AsPrime", compression.area}})) return false;
     r.As = sheet.Put("As", tension.area, T_DIM{0, 2}, "", r.round ? "half of the bars" : "", K);
     r.AsPrime = sheet.Put("As'", compression.area, T_DIM{0, 2}, "", "", K);

@@ -20,8 +20,8 @@ struct T_RC_BENDING {
     double Bars() const { return As + AsPrime + AsWeb; }
 };
 /// The rows of tension and compression are the bars within a tenth of the depth from the outermost
-/// ones; the rest is web. Of a circle they are the bars of either half, with d = 0.8 D (ACI 318
-/// 22.5.2.2), and a hoop has two legs. Refuses a side without bars.
+/// ones; the rest is web. Of a circle they are the bars of either half, those on the axis half to
+/// each, with d = 0.8 D (ACI 318 22.5.2.2), and a hoop has two legs. Refuses a side without bars.
 std::optional<T_RC_BENDING> RcBending(const T_SECT_D& section, bool aboutY, bool positive,
                                       CCodeSheet& sheet);
 
