@@ -1,8 +1,8 @@
 #include "qm_rps/codehingedlg.h"
 
 #include "qm_base/say.h"
-#include "qm_base/textformat.h"
 #include "qm_rps/desk/elementlist.h"
+#include "qm_rps/desk/tracetable.h"
 
 #include <algorithm>
 
@@ -218,18 +218,11 @@ void CCodeHingeDlg::Show()
 
 T_TEXT_TABLE CCodeHingeDlg::Trace() const
 {
-    const T_UNITS units = m_doc.Unit().Units();
-    T_TEXT_TABLE table;
-    for (const char* key : {"IDS_QM_UI_GEN_SYMBOL", "IDS_QM_UI_GEN_VALUE", "IDS_QM_UI_GEN_UNIT",
-                            "IDS_QM_UI_GEN_FORMULA", "IDS_QM_UI_GEN_CLAUSE", "IDS_QM_UI_GEN_MARK"})
-        table.columns.push_back({Say(key), table.columns.size() == 1});
     const auto rows = Rows();
-    if (m_side < 0 || m_side >= std::ssize(rows)) return table;
-    for (const T_CODE_TRACE& line : rows[static_cast<std::size_t>(m_side)].of->trace)
-        table.rows.push_back({line.symbol, FormatText("%.5g", FromSi(line.value, units, line.dim)),
-                              UnitText(line.dim, units), line.text, line.clause,
-                              MarkText(line.mark)});
-    return table;
+    const bool any = m_side >= 0 && m_side < std::ssize(rows);
+    return TraceTable(any ? rows[static_cast<std::size_t>(m_side)].of->trace
+                          : std::vector<T_CODE_TRACE>(),
+                      m_options.Units());
 }
 
 std::string CCodeHingeDlg::WarningsText() const

@@ -1,9 +1,11 @@
-// Model of the window with the curves of sections: moment-curvature, interaction, surface.
+// Model of the window with the curves of sections: moment-curvature, interaction, surface; and with
+// the check of given forces.
 #pragma once
 
 #include "qm_base/mdialog.h"
 #include "qm_db/dbdoc.h"
 #include "qm_rps/dialog/texttable.h"
+#include "qm_rps/section/sectioncheck.h"
 #include "qm_rps/section/sectioncurves.h"
 
 #include <functional>
@@ -25,7 +27,7 @@ public:
     T_SECTION_OPTIONS m_options;
     double m_directionDeg = 0.0;
     std::string m_axial = "0"; // in units of the document, with blanks between them
-    void OnChanged() { m_answers.clear(); }
+    void OnChanged();
 
     /// The result of a page; calculated when it is asked for. None: ReasonOf says why not.
     const T_SECTION_ANSWER* Answer(SECTION_TASK task);
@@ -41,16 +43,42 @@ public:
     /// written, or cancelled; 0 with a message.
     int OnExport(SECTION_TASK task);
 
+    // ---- given forces ----
+    /// In units of the document; OnChanged after a change, as for the two below.
+    T_SECTION_FORCES m_forces;
+    /// Whose rules beside those of no code: 0 all that fit, 1 the first of kSectionCheckCodeNames.
+    int m_checkCode = 0;
+    double m_cotTheta = 1.0;
+    bool IsConcrete() const; // its shear asks for cot theta
+
+    /// Ways of checking, with ratios and verdicts: the rows of Ways.
+    T_TEXT_TABLE Ways();
+    const T_SECTION_WAY* WayAt(std::size_t row);
+    int Way() const { return m_way; } // chosen row; -1: none
+    void OnWay(int row);
+    /// Every number of the chosen way.
+    T_TEXT_TABLE WayTrace();
+    /// Section, strengths and warnings; or why nothing was checked.
+    std::string CheckText();
+    /// As OnExport: the table of the command that checks sections.
+    int OnExportCheck();
+
 private:
+    template <class T>
     struct T_PAGE {
-        std::optional<T_SECTION_ANSWER> answer;
+        std::optional<T> answer;
         std::string reason;
     };
-    const T_PAGE& Page(SECTION_TASK task);
+    const T_PAGE<T_SECTION_ANSWER>& Page(SECTION_TASK task);
+    const T_PAGE<T_SECTION_CHECK>& Checked();
+    const std::vector<T_SECTION_WAY>& CheckedWays();
     bool ReadAxial(std::vector<double>& out) const;
+    int Export(const std::function<T_TEXT_TABLE()>& table);
 
     CDBDoc& m_doc;
     std::vector<T_SECTION_PAIR> m_pairs;
     int m_pair = -1;
-    std::map<SECTION_TASK, T_PAGE> m_answers;
+    std::map<SECTION_TASK, T_PAGE<T_SECTION_ANSWER>> m_answers;
+    std::optional<T_PAGE<T_SECTION_CHECK>> m_check;
+    int m_way = -1;
 };

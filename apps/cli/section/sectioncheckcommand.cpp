@@ -13,15 +13,6 @@
 
 namespace {
 
-constexpr std::array<T_DIM, 6> kDims{kDimForce, kDimMoment, kDimMoment,
-                                     kDimForce, kDimForce,  kDimMoment};
-constexpr std::array<const char*, 6> kKeys{"N", "My", "Mz", "Vy", "Vz", "T"};
-
-std::array<double*, 6> ForcesOf(T_SECTION_FORCES& f)
-{
-    return {&f.N, &f.My, &f.Mz, &f.Vy, &f.Vz, &f.T};
-}
-
 /// A set for each value of the longest list; lists of another length than that and 1 are refused.
 EXIT_CODE ReadForces(const T_SECTION_CHECK_COMMAND& c, const T_UNITS& units,
                      std::vector<T_SECTION_FORCES>& out)
@@ -35,10 +26,11 @@ EXIT_CODE ReadForces(const T_SECTION_CHECK_COMMAND& c, const T_UNITS& units,
                                 std::to_string(size), std::to_string(count)));
     }
     for (std::size_t i = 0; i < count; ++i) {
-        const std::array<double*, 6> forces = ForcesOf(out.emplace_back());
-        for (std::size_t k = 0; k < forces.size(); ++k)
+        T_SECTION_FORCES& forces = out.emplace_back();
+        for (std::size_t k = 0; k < c.forces.size(); ++k)
             if (const std::vector<double>& list = c.forces[k]; !list.empty())
-                *forces[k] = ToSi(list[list.size() > 1 ? i : 0], units, kDims[k]);
+                forces.*kSectionForces[k].value =
+                    ToSi(list[list.size() > 1 ? i : 0], units, kSectionForces[k].dim);
     }
     return EXIT_CODE::Done;
 }
@@ -49,20 +41,19 @@ void WriteWay(CJsonText& w, const T_SECTION_WAY& way, const T_UNITS& units)
     w.Member("checked", kSectionCheckedNames[static_cast<std::size_t>(way.what)]);
     w.Member("by", way.by.empty() ? std::string("section calculator") : way.by);
     w.Member("ratio", way.ratio);
-    w.Member("verdict", !way.ratio ? "not checked" : *way.ratio > 1.0 ? "exceeded" : "kept");
+    w.Member("verdict", !way.ratio ? "not checked" : way.IsExceeded() ? "exceeded" : "kept");
     if (!way.ratio) w.Member("reason", way.reason);
     WriteTrace(w, "trace", way.trace, units);
     WriteWarnings(w, way.warnings);
     w.End();
 }
 
-void WriteSet(CJsonText& w, T_SECTION_CHECKS set, const T_UNITS& units)
+void WriteSet(CJsonText& w, const T_SECTION_CHECKS& set, const T_UNITS& units)
 {
     w.Object();
     w.Key("forces").Object(kJsonOneLine);
-    const std::array<double*, 6> forces = ForcesOf(set.forces);
-    for (std::size_t k = 0; k < forces.size(); ++k)
-        w.Member(kKeys[k], FromSi(*forces[k], units, kDims[k]));
+    for (const T_SECTION_FORCE& force : kSectionForces)
+        w.Member(force.name, FromSi(set.forces.*force.value, units, force.dim));
     w.End();
     w.Key("ways").List();
     for (const T_SECTION_WAY& way : set.ways)

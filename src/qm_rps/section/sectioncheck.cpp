@@ -90,9 +90,9 @@ std::string RequestFault(const T_SECTION_CHECK_REQUEST& request)
 {
     bool any = false;
     for (const T_SECTION_FORCES& f : request.forces)
-        for (const double force : {f.N, f.My, f.Mz, f.Vy, f.Vz, f.T}) {
-            if (!std::isfinite(force)) return Say("IDS_QM_SECK_NOT_FINITE");
-            any = any || force != 0.0;
+        for (const T_SECTION_FORCE& force : kSectionForces) {
+            if (!std::isfinite(f.*force.value)) return Say("IDS_QM_SECK_NOT_FINITE");
+            any = any || f.*force.value != 0.0;
         }
     return any ? std::string() : Say("IDS_QM_SECK_NO_FORCES");
 }

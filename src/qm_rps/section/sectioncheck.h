@@ -9,7 +9,20 @@
 struct T_SECTION_FORCES {
     double N = 0.0, My = 0.0, Mz = 0.0;
     double Vy = 0.0, Vz = 0.0, T = 0.0; // shear along y and z, torsion
+    bool operator==(const T_SECTION_FORCES&) const = default;
 };
+struct T_SECTION_FORCE {
+    const char* name;
+    T_DIM dim;
+    double T_SECTION_FORCES::*value;
+};
+inline constexpr std::array<T_SECTION_FORCE, 6> kSectionForces{
+    {{"N", kDimForce, &T_SECTION_FORCES::N},
+     {"My", kDimMoment, &T_SECTION_FORCES::My},
+     {"Mz", kDimMoment, &T_SECTION_FORCES::Mz},
+     {"Vy", kDimForce, &T_SECTION_FORCES::Vy},
+     {"Vz", kDimForce, &T_SECTION_FORCES::Vz},
+     {"T", kDimMoment, &T_SECTION_FORCES::T}}};
 
 enum class SECTION_CHECK_CODE { En, Aisc, Aci };
 inline constexpr std::array<const char*, 3> kSectionCheckCodeNames{"EN", "AISC", "ACI"};
@@ -33,6 +46,8 @@ struct T_SECTION_WAY {
     std::string reason;            // why it was not
     std::vector<T_CODE_TRACE> trace;
     std::vector<T_CODE_WARNING> warnings;
+
+    bool IsExceeded() const { return ratio && *ratio > 1.0; }
 };
 struct T_SECTION_CHECKS {
     T_SECTION_FORCES forces;

@@ -27,36 +27,39 @@ std::string ByText(const T_SECTION_WAY& way)
 std::string VerdictText(const T_SECTION_WAY& way)
 {
     if (!way.ratio) return Say("IDS_QM_SECK_NOT_CHECKED", way.reason);
-    return Say(*way.ratio > 1.0 ? "IDS_QM_SECK_EXCEEDED" : "IDS_QM_SECK_KEPT");
+    return Say(way.IsExceeded() ? "IDS_QM_SECK_EXCEEDED" : "IDS_QM_SECK_KEPT");
 }
 
 } // namespace
 
+T_TEXT_TABLE SectionWaysTable(const std::vector<T_SECTION_WAY>& ways)
+{
+    T_TEXT_TABLE t;
+    t.columns = {{Say("IDS_QM_SECK_HEAD_WHAT")},
+                 {Say("IDS_QM_SECK_HEAD_BY")},
+                 {Say("IDS_QM_SECK_HEAD_RATIO"), true},
+                 {Say("IDS_QM_SECK_HEAD_VERDICT")}};
+    for (const T_SECTION_WAY& way : ways)
+        t.rows.push_back({WhatText(way), ByText(way),
+                          way.ratio ? FormatText("%.4g", *way.ratio) : std::string("-"),
+                          VerdictText(way)});
+    return t;
+}
+
 T_TEXT_TABLE SectionCheckTable(const T_SECTION_CHECK& check, const T_UNITS& units)
 {
     T_TEXT_TABLE t;
-    const auto head = [&](const char* name, T_DIM dim) {
-        t.columns.push_back({HeadWithUnit(name, dim, units), true});
-    };
-    head("N", kDimForce), head("My", kDimMoment), head("Mz", kDimMoment);
-    head("Vy", kDimForce), head("Vz", kDimForce), head("T", kDimMoment);
-    t.columns.push_back({Say("IDS_QM_SECK_HEAD_WHAT"), false});
-    t.columns.push_back({Say("IDS_QM_SECK_HEAD_BY"), false});
-    t.columns.push_back({Say("IDS_QM_SECK_HEAD_RATIO"), true});
-    t.columns.push_back({Say("IDS_QM_SECK_HEAD_VERDICT"), false});
+    for (const T_SECTION_FORCE& force : kSectionForces)
+        t.columns.push_back({HeadWithUnit(force.name, force.dim, units), true});
+    const std::vector<T_TEXT_COLUMN> heads = SectionWaysTable({}).columns;
+    t.columns.insert(t.columns.end(), heads.begin(), heads.end());
     for (const T_SECTION_CHECKS& set : check.sets)
-        for (const T_SECTION_WAY& way : set.ways) {
-            const T_SECTION_FORCES& f = set.forces;
+        for (const std::vector<std::string>& way : SectionWaysTable(set.ways).rows) {
             std::vector<std::string>& row = t.rows.emplace_back();
-            const auto cell = [&](double si, T_DIM dim) {
-                row.push_back(FormatText("%.6g", FromSi(si, units, dim) + 0.0));
-            };
-            cell(f.N, kDimForce), cell(f.My, kDimMoment), cell(f.Mz, kDimMoment);
-            cell(f.Vy, kDimForce), cell(f.Vz, kDimForce), cell(f.T, kDimMoment);
-            row.push_back(WhatText(way));
-            row.push_back(ByText(way));
-            row.push_back(way.ratio ? FormatText("%.4g", *way.ratio) : std::string("-"));
-            row.push_back(VerdictText(way));
+            for (const T_SECTION_FORCE& force : kSectionForces)
+                row.push_back(
+                    FormatText("%.6g", FromSi(set.forces.*force.value, units, force.dim) + 0.0));
+            row.insert(row.end(), way.begin(), way.end());
         }
     return t;
 }

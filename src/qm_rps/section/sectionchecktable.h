@@ -4,8 +4,11 @@
 #include "qm_rps/dialog/texttable.h"
 #include "qm_rps/section/sectioncheck.h"
 
-/// Forces, then what was checked by which way, ratio, verdict (a reason where it was not checked);
-/// a row for each way of each set of forces.
+/// What was checked by which way, ratio, verdict (a reason where it was not checked); a row for
+/// each way.
+T_TEXT_TABLE SectionWaysTable(const std::vector<T_SECTION_WAY>& ways);
+
+/// Forces, then the table of the ways; a row for each way of each set of forces.
 T_TEXT_TABLE SectionCheckTable(const T_SECTION_CHECK& check, const T_UNITS& units);
 
 /// The section with its strengths and warnings, a line each; then what the ways warn of.

@@ -1,6 +1,7 @@
 #include "qm_ui/section/sectionviews.h"
 
 #include "qm_base/say.h"
+#include "qm_rps/dialog/unithead.h"
 #include "qm_rps/sectioncurvesdlg.h"
 #include "qm_ui/push/stepfield.h"
 #include "qm_ui/section/sectionplot.h"
@@ -57,7 +58,8 @@ void AddOptions(CFormView& form, DLG& d)
            "law");
     narrow(form.Choice(KeyText("IDS_QM_UI_SECC_CORE"), Option(d, &T_SECTION_OPTIONS::core),
                        KeyTexts({"IDS_QM_UI_SECC_CORE_PLAIN", "IDS_QM_SECC_CORE_MANDER",
-                                 "IDS_QM_SECC_CORE_EUROCODE"})),
+                                 "IDS_QM_SECC_CORE_EUROCODE", "IDS_QM_SECC_CORE_NTC",
+                                 "IDS_QM_SECC_CORE_EN1998"})),
            "core");
     narrow(form.Number(KeyText("IDS_QM_UI_SECC_DIRECTION"), Member(d, d.m_directionDeg)),
            "direction");
@@ -96,6 +98,60 @@ void AddPage(CFormView& form, DLG& d, SECTION_TASK task, const char* title)
         name + ".export";
 }
 
+void AddForces(CFormView& form, DLG& d)
+{
+    std::vector<TextFn> heads;
+    for (const T_SECTION_FORCE& force : kSectionForces)
+        heads.push_back([&d, &force] { return HeadWithUnit(force.name, force.dim, d.Units()); });
+    form.Cells(heads);
+    for (std::size_t i = 0; i < heads.size(); ++i)
+        form.Number(heads[i], Member(d, d.m_forces.*kSectionForces[i].value)).name =
+            std::string("check.") + kSectionForces[i].name;
+    form.EndCells();
+    form.Columns();
+    form.Choice(KeyText("IDS_QM_UI_SECK_CODE"), Member(d, d.m_checkCode),
+                [] {
+                    std::vector<std::string> texts{Say("IDS_QM_UI_SECK_ALL")};
+                    texts.insert(texts.end(), kSectionCheckCodeNames.begin(),
+                                 kSectionCheckCodeNames.end());
+                    return texts;
+                })
+        .name = "check.code";
+    form.NextColumn();
+    CFormField& cot = form.Number(KeyText("IDS_QM_UI_SECK_COT"), Member(d, d.m_cotTheta));
+    cot.name = "check.cotTheta";
+    cot.shown = [&d] { return d.IsConcrete(); };
+    form.EndColumns();
+}
+
+/// The ways by their verdicts, then every number of the chosen one.
+void AddCheckPage(CFormView& form, DLG& d)
+{
+    form.Page(KeyText("IDS_QM_UI_SECK_PAGE"));
+    AddForces(form, d);
+    T_GRID_BINDING ways = GridOf([&d] { return d.Ways(); });
+    ways.select = [&d](int row) {
+        if (row != d.Way()) d.OnWay(row);
+    };
+    ways.selected = [&d] { return d.Way(); };
+    ways.tone = [&d](std::size_t row, std::size_t) {
+        const T_SECTION_WAY* const way = d.WayAt(row);
+        if (!way || (way->ratio && !way->IsExceeded())) return CELL_TONE::Plain;
+        return way->ratio ? CELL_TONE::Fault : CELL_TONE::Notice;
+    };
+    CFormField& table = form.Grid(std::move(ways));
+    table.name = "check.table";
+    table.widget->setMinimumHeight(150);
+    form.Note([&d] { return d.CheckText(); }).name = "check.text";
+    CFormField& trace = form.Grid(GridOf([&d] { return d.WayTrace(); }));
+    trace.name = "check.trace";
+    trace.widget->setMinimumHeight(120);
+    form.Note(KeyText("IDS_QM_SECK_SIGNS"));
+    form.Note(KeyText("IDS_QM_UI_SECK_NOTE"));
+    form.Button(KeyText("IDS_QM_UI_SECK_EXPORT"), [&d] { (void)d.OnExportCheck(); }).name =
+        "check.export";
+}
+
 void BuildCurves(CFormView& form, DLG& d)
 {
     form.Columns();
@@ -105,6 +161,7 @@ void BuildCurves(CFormView& form, DLG& d)
     AddPage(form, d, SECTION_TASK::Interaction, "IDS_QM_UI_SECC_INTERACTION");
     AddPage(form, d, SECTION_TASK::Surface, "IDS_QM_UI_SECC_SURFACE");
     AddPage(form, d, SECTION_TASK::Capacity, "IDS_QM_PLOT_SECC_CAPACITY");
+    AddCheckPage(form, d);
     form.EndPages();
     form.EndColumns();
 }
