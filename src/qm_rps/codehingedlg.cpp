@@ -63,7 +63,7 @@ void CCodeHingeDlg::OnStale()
 
 std::string CCodeHingeDlg::ElementsText() const
 {
-    return ElementListText({m_elements.begin(), m_elements.end()});
+    return ElementListText(Chosen());
 }
 
 int CCodeHingeDlg::OnElements(const std::string& text)
@@ -88,7 +88,10 @@ int CCodeHingeDlg::OnElements(const std::string& text)
 
 std::vector<std::string> CCodeHingeDlg::CodeTexts()
 {
-    return {kHingeCodeNames.begin(), kHingeCodeNames.end()};
+    std::vector<std::string> texts(kHingeCodeNames.begin(), kHingeCodeNames.end());
+    texts.at(static_cast<std::size_t>(HINGE_CODE::Aisc342)) +=
+        " (" + Say("IDS_QM_UI_GEN_STEEL_COLUMNS") + ")";
+    return texts;
 }
 
 // ---- what they would get ------------------------------------------------------------------------
@@ -118,7 +121,7 @@ int CCodeHingeDlg::OnPreview()
     T_CODE_REQUEST request;
     T_CODE_HINGES hinges;
     T_HINGE_REFUSAL refusal;
-    if (!m_options.Read({m_elements.begin(), m_elements.end()}, request, refusal.text) ||
+    if (!m_options.Read(Chosen(), request, refusal.text) ||
         !m_options.Preview(request, hinges, refusal)) {
         Forget();
         m_status = Say("IDS_QM_UI_GEN_NO_HINGES", refusal.text);
@@ -259,7 +262,7 @@ int CCodeHingeDlg::OnApply()
     T_CODE_REQUEST request;
     T_CODE_HINGES hinges;
     T_HINGE_REFUSAL refusal;
-    if (!m_options.Read({m_elements.begin(), m_elements.end()}, request, refusal.text) ||
+    if (!m_options.Read(Chosen(), request, refusal.text) ||
         !m_options.Generate(request, hinges, refusal))
         return Refuse(refusal);
     Take(std::move(hinges));

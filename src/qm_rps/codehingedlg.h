@@ -33,8 +33,10 @@ public:
     [[nodiscard]] int OnElements(const std::string& text);
 
     // ---- code ----
+    /// Names; with what a code is for where it is for some members alone.
     static std::vector<std::string> CodeTexts();
     CCodeHingeOptions m_options;
+    bool AsksConnection() const { return m_options.AsksConnection(Chosen()); }
     /// After each change of the options.
     void OnOptions() { Forget(); }
 
@@ -74,6 +76,7 @@ public:
     bool HasStale() { return !m_types.StaleElements().empty(); }
 
 private:
+    std::vector<int> Chosen() const { return {m_elements.begin(), m_elements.end()}; }
     void Forget();
     void Take(T_CODE_HINGES hinges);
     void Show();

@@ -133,7 +133,7 @@ TEST_F(CodeHingeWindows, ThePreviewIsWhatIsStoredAndOneEdit)
         // Another choice is not the one that was previewed.
         ChooseIndex(code, 0);
         EXPECT_EQ(0, types.rowCount());
-        ChooseIndex(code, 3);
+        ChooseIndex(code, static_cast<int>(HINGE_CODE::En1998));
         Push(w, "IDS_QM_UI_GEN_APPLY");
         EXPECT_TRUE(Says(w, "10 elements have hinges"));
         for (const auto& [key, hinge] : Model().hinges)
@@ -292,6 +292,45 @@ TEST_F(CodeHingeWindows, AxialForcesAreThoseOfTheUnitsAndOfTheStaleTypes)
     });
     for (const auto& [key, type] : Model().hingeTypes)
         EXPECT_EQ((std::vector<double>{1e5, 3e5}), type.generated->axialRange);
+}
+
+// By hand: IPE 300, 11.811 in deep, all that the factors ask for given as kept: a = 0.050 - 0.0003
+// 11.811. Without plates the column's 15 mm stand below 150/7: 0.8 of it.
+TEST_F(CodeHingeWindows, BeamsOfSteelTakeTheirConnection)
+{
+    ASSERT_TRUE(Open("steel-frame-code-hinges"));
+    const auto traced = [](CDialogWindow& w, const char* symbol) {
+        QAbstractItemModel& trace = Grid(w, "trace").Model();
+        for (int row = 0; row < trace.rowCount(); ++row)
+            if (Cell(trace, row, 0) == symbol) return Cell(trace, row, 1).toDouble();
+        return -1.0;
+    };
+    Show([&](CDialogWindow& w) {
+        auto* const code = qobject_cast<QComboBox*>(Field(w, "code"));
+        const int aisc = static_cast<int>(HINGE_CODE::Aisc342);
+        EXPECT_EQ("AISC342-22 (steel columns alone)", code->itemText(aisc));
+        ChooseIndex(code, static_cast<int>(HINGE_CODE::Asce17));
+        Enter(w, "elements", "101, 121"); // a column, a brace
+        EXPECT_TRUE(Field(w, "connection")->isHidden());
+        Enter(w, "elements", "111");
+        EXPECT_FALSE(Field(w, "connection")->isHidden());
+        EXPECT_TRUE(Field(w, "panelRatio")->isHidden());
+        ChooseIndex(Field(w, "connection"), 6);
+        Enter(w, "panelRatio", "-0.75");
+        Push(w, "IDS_QM_UI_GEN_PREVIEW");
+        EXPECT_TRUE(Says(w, "Vpz/Vye (empty: of the frame): -0.75, expected above 0"));
+        Enter(w, "panelRatio", "0.75");
+        Push(w, "IDS_QM_UI_GEN_PREVIEW");
+        EXPECT_NEAR(0.8 * (0.050 - 0.0003 * 300 / 25.4), traced(w, "a"), 1e-6);
+        Enter(w, "continuityPlate", "0.0107");
+        Push(w, "IDS_QM_UI_GEN_PREVIEW");
+        EXPECT_NEAR(0.050 - 0.0003 * 300 / 25.4, traced(w, "a"), 1e-6);
+        Push(w, "IDS_QM_UI_GEN_APPLY");
+        Cancel(w);
+    });
+    ASSERT_EQ(1U, Model().hingeTypes.size());
+    const T_STEEL_CONNECTION kept{"RBS", 0.0, 0.0107, 0.75};
+    EXPECT_EQ(kept, Model().hingeTypes.begin()->second.generated->connection);
 }
 
 TEST_F(CodeHingeWindows, HingesArePushedEvaluatedAndJudgedAsByCommands)

@@ -2,8 +2,10 @@
 
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/push/pushstoreys.h"
 
 #include <algorithm>
+#include <cmath>
 
 namespace {
 
@@ -28,6 +30,21 @@ std::optional<HINGE_CODE> CodeOf(const T_GENERATED& made)
     const auto code = std::ranges::find(kHingeCodeNames, made.code);
     if (code == kHingeCodeNames.end()) return {};
     return static_cast<HINGE_CODE>(code - kHingeCodeNames.begin());
+}
+
+/// A beam element of steel that rises by 45 degrees at most: to the generator it is no column.
+bool IsSteelBeam(const T_MODEL& model, int id)
+{
+    const auto element = model.elements.find(id);
+    if (element == model.elements.end() || element->second.kind != ELEM_KIND::Beam) return false;
+    const auto material = model.materials.find(element->second.material);
+    if (material == model.materials.end() || material->second.type != MATL_CLASS::Steel)
+        return false;
+    const std::array<double, 3>& i = model.nodes.at(element->second.nodeI).xyz;
+    const std::array<double, 3>& j = model.nodes.at(element->second.nodeJ).xyz;
+    const std::size_t up = VerticalAxis(model);
+    const double length = std::hypot(j[0] - i[0], j[1] - i[1], j[2] - i[2]);
+    return std::fabs(j[up] - i[up]) <= std::sqrt(0.5) * length;
 }
 
 } // namespace
@@ -61,10 +78,57 @@ bool CCodeHingeOptions::HasMasonry() const
     });
 }
 
+bool CCodeHingeOptions::AsksConnection(const std::vector<int>& elements) const
+{
+    const T_MODEL& model = m_doc.Data().Model();
+    return m_code == HINGE_CODE::Asce17 &&
+           std::ranges::any_of(elements, [&](int id) { return IsSteelBeam(model, id); });
+}
+
+std::vector<std::string> CCodeHingeOptions::ConnectionTexts()
+{
+    std::vector<std::string> texts{Say("IDS_QM_UI_GEN_NO_CONNECTION")};
+    texts.insert(texts.end(), kFrConnectionNames.begin(), kFrConnectionNames.end());
+    return texts;
+}
+
+void CCodeHingeOptions::TakeConnection(const std::optional<T_STEEL_CONNECTION>& connection)
+{
+    m_connection = 0;
+    m_measures = {};
+    if (!connection) return;
+    const auto kind = std::ranges::find(kFrConnectionNames, connection->kind);
+    if (kind == kFrConnectionNames.end()) return;
+    m_connection = 1 + static_cast<int>(kind - kFrConnectionNames.begin());
+    for (std::size_t i = 0; i < m_measures.size(); ++i) {
+        const T_CONNECTION_MEASURE& measure = kConnectionMeasures[i];
+        const double value = (*connection).*measure.value;
+        if (value > 0.0) m_measures[i] = FromSi(value, Units(), measure.dim);
+    }
+}
+
+int CCodeHingeOptions::ReadConnection(T_CODE_REQUEST& request, std::string& reason) const
+{
+    if (m_connection < 1 || !AsksConnection(request.elements)) return 1;
+    T_STEEL_CONNECTION& connection = request.options.connection.emplace();
+    connection.kind = kFrConnectionNames.at(static_cast<std::size_t>(m_connection - 1));
+    for (std::size_t i = 0; i < m_measures.size(); ++i) {
+        const T_CONNECTION_MEASURE& measure = kConnectionMeasures[i];
+        if (!m_measures[i]) continue;
+        if (!(*m_measures[i] > 0.0)) {
+            reason = Say("IDS_QM_UI_GEN_MEASURE", Say(measure.key), ShortestText(*m_measures[i]));
+            return 0;
+        }
+        connection.*measure.value = ToSi(*m_measures[i], Units(), measure.dim);
+    }
+    return 1;
+}
+
 void CCodeHingeOptions::TakeStale(const std::vector<int>& elements)
 {
     m_pushed.clear();
     const T_GENERATED* first = nullptr;
+    std::optional<T_STEEL_CONNECTION> connection;
     const T_MODEL& model = m_doc.Data().Model();
     for (const auto& entry : model.hinges) {
         const int element = entry.second.element;
@@ -75,8 +139,10 @@ void CCodeHingeOptions::TakeStale(const std::vector<int>& elements)
         const T_GENERATED& made = *type->second.generated;
         if (!made.pushed.empty()) m_pushed[element] = made.pushed;
         if (!first && CodeOf(made)) first = &made;
+        if (!connection) connection = made.connection;
     }
     m_shear = m_pushed.empty() ? 0 : static_cast<int>(std::ssize(ShearTexts())) - 1;
+    TakeConnection(connection);
     if (!first) return;
     m_code = *CodeOf(*first);
     m_secondary = first->secondary;
@@ -114,6 +180,7 @@ int CCodeHingeOptions::Read(std::vector<int> elements, T_CODE_REQUEST& out,
         request.options.axialRange = {ToSi(*from, Units(), kDimForce),
                                       ToSi(*to, Units(), kDimForce)};
     }
+    if (!ReadConnection(request, reason)) return 0;
     out = std::move(request);
     return 1;
 }

@@ -5,7 +5,19 @@
 
 #include <array>
 
-/// Forces are in current units. The document must outlive the object.
+/// What a connection of steel beams is asked for beside its kind.
+struct T_CONNECTION_MEASURE {
+    const char* key; // of its caption
+    const char* name;
+    T_DIM dim;
+    double T_STEEL_CONNECTION::*value;
+};
+inline constexpr std::array<T_CONNECTION_MEASURE, 3> kConnectionMeasures{
+    {{"IDS_QM_UI_GEN_COLUMN_FLANGE", "columnFlange", kDimLength, &T_STEEL_CONNECTION::columnFlange},
+     {"IDS_QM_UI_GEN_PLATE", "continuityPlate", kDimLength, &T_STEEL_CONNECTION::continuityPlate},
+     {"IDS_QM_UI_GEN_PANEL", "panelRatio", kDimNone, &T_STEEL_CONNECTION::panelRatio}}};
+
+/// Forces and lengths are in current units. The document must outlive the object.
 class CCodeHingeOptions {
 public:
     /// The code is EN 1998-3 in a model of Eurocodes, else ASCE 41-17.
@@ -30,7 +42,15 @@ public:
     bool HasMasonry() const;
     double m_tie = 0.0;
 
-    /// Code, level, forces of the first of the elements' stale types, and each one's V of a push.
+    /// Fully restrained connections of steel beams: asked for where there are such among the
+    /// elements and the code is ASCE 41-17. 0: none.
+    bool AsksConnection(const std::vector<int>& elements) const;
+    static std::vector<std::string> ConnectionTexts();
+    int m_connection = 0;
+    std::array<std::optional<double>, 3> m_measures; // empty: of the frame; plates: none
+
+    /// Code, level, forces of the first of the elements' stale types, the first connection among
+    /// them, and each one's V of a push.
     void TakeStale(const std::vector<int>& elements);
 
     /// As the generator takes it. 1 done; 0 with the reason, `out` as it was.
@@ -46,6 +66,8 @@ public:
     T_UNITS Units() const { return m_doc.Data().Units(); }
 
 private:
+    int ReadConnection(T_CODE_REQUEST& request, std::string& reason) const;
+    void TakeConnection(const std::optional<T_STEEL_CONNECTION>& connection);
     int Make(CDBDoc& doc, const T_CODE_REQUEST& request, T_CODE_HINGES& out,
              T_HINGE_REFUSAL& refusal) const;
     CDBDoc& m_doc;

@@ -101,6 +101,24 @@ T_BINDING<int> OptionIndex(DLG& d, E& value)
             }};
 }
 
+/// What is not given is read from the frame.
+void AddConnection(CFormView& form, DLG& d)
+{
+    CCodeHingeOptions& o = d.m_options;
+    CFormField& kind = form.Choice(KeyText("IDS_QM_UI_GEN_CONNECTION"), Option(d, o.m_connection),
+                                   [] { return CCodeHingeOptions::ConnectionTexts(); });
+    kind.name = "connection";
+    kind.shown = [&d] { return d.AsksConnection(); };
+    for (std::size_t i = 0; i < kConnectionMeasures.size(); ++i) {
+        const T_CONNECTION_MEASURE& measure = kConnectionMeasures[i];
+        CFormField& field = form.Optional(
+            [&o, &measure] { return HeadWithUnit(Say(measure.key), measure.dim, o.Units()); },
+            Option(d, o.m_measures[i]));
+        field.name = measure.name;
+        field.shown = [&d] { return d.AsksConnection() && d.m_options.m_connection > 0; };
+    }
+}
+
 void AddOptions(CFormView& form, DLG& d)
 {
     CCodeHingeOptions& o = d.m_options;
@@ -131,6 +149,7 @@ void AddOptions(CFormView& form, DLG& d)
     CFormField& tie = form.Number(head("IDS_QM_UI_GEN_TIE"), Option(d, o.m_tie));
     tie.name = "tie";
     tie.shown = [&o] { return o.HasMasonry(); };
+    AddConnection(form, d);
 }
 
 void AddMembers(CFormView& form, DLG& d)
