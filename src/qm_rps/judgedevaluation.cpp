@@ -4,10 +4,12 @@
 #include "qm_db/recordfacts.h"
 #include "qm_rps/judge/judgementtext.h"
 #include "qm_rps/judge/spectrumfactor.h"
+#include "qm_rps/judge/stalehinges.h"
 #include "qm_rps/pushovercalculators.h"
 
 #include <algorithm>
 #include <cmath>
+#include <map>
 
 namespace {
 
@@ -91,6 +93,16 @@ public:
         T_FINDING refusal;
         m_isSet = m_evaluator.SetEvaluation(eval, refusal) != 0;
     }
+    /// The factor at which the target of a limit state is a displacement; each is found once.
+    std::optional<double> FactorTo(double displacement, const std::string& state)
+    {
+        const auto [at, isNew] = m_factors.try_emplace({displacement, state});
+        if (!isNew) return at->second;
+        const double now = At(1.0, state).value_or(displacement);
+        at->second = FactorFor(displacement, now > 0.0 ? displacement / now : 1.0,
+                               [&](double factor) { return At(factor, state); });
+        return at->second;
+    }
     /// state: of a target displacement; else the performance point.
     std::optional<double> At(double factor, const std::string& state)
     {
@@ -129,7 +141,16 @@ private:
     const T_EVAL_D& m_eval;
     CPushEvaluator m_evaluator;
     bool m_isSet = false;
+    std::map<std::pair<double, std::string>, std::optional<double>> m_factors;
 };
+
+/// The limit state whose demand is the target displacement itself: of DL, SD, NC, whose demands are
+/// shares and multiples of one target (EN 1998-3), SD; else each its own.
+std::string TargetOf(const std::string& state)
+{
+    const T_LEVELS& shares = kLevelNames[1];
+    return std::ranges::find(shares, state) == shares.end() ? state : shares[1];
+}
 
 T_JUDGED_LIMIT LimitOf(const T_FIRST_PASS& first, const T_JUDGED_STATE& state,
                        const T_JUDGED_PATH& path, double start, CScaledEvaluation& scaled)
@@ -138,7 +159,9 @@ T_JUDGED_LIMIT LimitOf(const T_FIRST_PASS& first, const T_JUDGED_STATE& state,
     limit.first = first;
     limit.state = state.name;
     limit.demand = std::fabs(state.point.displacement - start);
-    limit.demandPga = scaled.Pga(state.point.state);
+    const std::string target = TargetOf(state.point.state);
+    limit.pga = scaled.Pga(target);
+    limit.demandFactor = target == state.point.state ? 1.0 : scaled.FactorTo(*limit.demand, target);
     if (!first.end) {
         const bool none = first.unchecked == first.all;
         limit.why = Say(none ? "IDS_QM_JUDGE_NO_END" : "IDS_QM_JUDGE_NOT_PASSED");
@@ -149,9 +172,8 @@ T_JUDGED_LIMIT LimitOf(const T_FIRST_PASS& first, const T_JUDGED_STATE& state,
         limit.why = Say(path.hasStart ? "IDS_QM_JUDGE_AT_START" : "IDS_QM_JUDGE_AT_FIRST");
         return limit;
     }
-    limit.factor = FactorFor(*limit.capacity, *limit.capacity / *limit.demand,
-                             [&](double factor) { return scaled.At(factor, state.point.state); });
-    if (!limit.factor) limit.why = Say("IDS_QM_JUDGE_NO_FACTOR");
+    limit.factor = scaled.FactorTo(*limit.capacity, target);
+    if (!limit.PgaRatio()) limit.why = Say("IDS_QM_JUDGE_NO_FACTOR");
     return limit;
 }
 
@@ -200,6 +222,8 @@ T_JUDGEMENT JudgeEvaluation(CDBDoc& doc, const T_PUSH_EVALUATION& result,
     if (!out.note.empty()) return out;
     out.ends = std::move(taker.ends);
     T_JUDGED_PATH path = std::move(taker.path);
+    out.start = run.startDisplacement;
+    out.stale = StaleHinges(doc);
     PutStart(run.startDisplacement, path);
     out.states = StatesOf(hinges, options, NamesOf(out.ends));
     for (T_JUDGED_STATE& state : out.states)

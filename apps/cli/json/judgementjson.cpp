@@ -22,6 +22,8 @@ public:
             w.Member("verdict", kVerdictNames[static_cast<std::size_t>(m_j.Verdict())]);
         else
             w.Member("reason", m_j.note);
+        if (!m_j.stale.empty()) w.Member("stale_hinges", m_j.stale);
+        if (m_j.note.empty()) w.Member("start_displacement", Shown(m_j.start, kDimLength));
         w.Key("factors").Object(kJsonOneLine);
         const T_JUDGE_FACTORS& f = m_j.options.factors;
         w.Member("gamma_c", f.gammaC).Member("gamma_s", f.gammaS).Member("gamma", f.gamma).End();
@@ -88,6 +90,7 @@ private:
         }
         const T_END_PLACE& place = end.place;
         w.Member("element", place.element);
+        if (end.kind == JUDGED_KIND::Spring) return;
         const char* const at = end.kind == JUDGED_KIND::Brace ? "C" : place.atJ ? "J" : "I";
         w.Beside().Member("end", at);
         w.Beside().Member("component", kComponentNames[static_cast<std::size_t>(place.component)]);
@@ -96,7 +99,7 @@ private:
     /// What the end does: of joints forces alone.
     void WriteMotion(CJsonText& w, const T_JUDGED_END& end, const T_JUDGED_ROW& row) const
     {
-        if (end.joint) return;
+        if (end.joint || end.kind == JUDGED_KIND::Spring) return;
         const bool brace = end.kind == JUDGED_KIND::Brace;
         const T_DIM dim = brace ? kDimLength : kDimNone;
         const auto known = [](double v) { return v > 0.0 ? std::optional(v) : std::nullopt; };
@@ -116,9 +119,12 @@ private:
         w.Beside().Member("by", end.basis == JUDGE_BASIS::Nothing ? std::nullopt
                                                                   : std::optional(end.Code()));
         w.Beside().Member("level", end.Levels()[state.level]);
-        w.Member("N", Shown(row.state.N, kDimForce)).Beside();
-        w.Member("M", Shown(row.state.M, kDimMoment)).Beside();
-        w.Member("V", Shown(row.state.V, kDimForce)).Beside();
+        const auto known = [&](double v) {
+            return end.HasForces() ? std::optional(v) : std::nullopt;
+        };
+        w.Member("N", Shown(known(row.state.N), kDimForce)).Beside();
+        w.Member("M", Shown(known(row.state.M), kDimMoment)).Beside();
+        w.Member("V", Shown(known(row.state.V), kDimForce)).Beside();
         WriteMotion(w, end, row);
         bool any = false;
         for (const T_MODE_CHECK& mode : row.checks.modes) {
@@ -148,6 +154,7 @@ private:
             w.End();
             return;
         }
+        w.Member("verdict", kVerdictNames[static_cast<std::size_t>(VerdictOf(state))]);
         w.Key("count").Object(kJsonOneLine);
         WriteCount(w, state.all);
         w.End();
@@ -188,10 +195,9 @@ private:
         w.Member("capacity_displacement", Shown(limit.capacity, kDimLength));
         w.Member("demand_displacement", Shown(limit.demand, kDimLength));
         w.Member("spectrum_factor", limit.factor);
-        w.Member("demand_pga", limit.demandPga);
-        w.Member("capacity_pga", limit.factor && limit.demandPga
-                                     ? std::optional(*limit.factor * *limit.demandPga)
-                                     : std::nullopt);
+        w.Member("pga_ratio", limit.PgaRatio());
+        w.Member("demand_pga", limit.DemandPga());
+        w.Member("capacity_pga", limit.CapacityPga());
         w.Member("ends_not_checked", first.unchecked);
         if (!limit.why.empty()) w.Member("reason", limit.why);
         w.End();

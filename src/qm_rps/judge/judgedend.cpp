@@ -275,7 +275,7 @@ std::vector<JUDGE_MODE> ModesOf(const T_JUDGED_END& end)
 {
     using enum JUDGE_MODE;
     if (end.kind == JUDGED_KIND::Joint) return {Joint};
-    if (end.kind == JUDGED_KIND::Brace) return {Elongation};
+    if (end.kind == JUDGED_KIND::Brace || end.kind == JUDGED_KIND::Spring) return {Elongation};
     const bool code = end.basis == JUDGE_BASIS::Code;
     if (code && end.member.material.type == MATL_CLASS::Steel && end.member.HasAxial())
         return {Rotation, Shear, Axial};

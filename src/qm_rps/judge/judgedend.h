@@ -33,9 +33,10 @@ struct T_JUDGE_FACTORS {
     bool operator==(const T_JUDGE_FACTORS&) const = default;
 };
 
-enum class JUDGED_KIND { End, Brace, Joint };
+enum class JUDGED_KIND { End, Brace, Joint, Spring };
 
-/// One end of a member about one axis; a whole brace; a joint in one plane.
+/// One end of a member about one axis; a whole brace (any truss); a joint in one plane; a link or a
+/// spring, which is not judged.
 struct T_JUDGED_END {
     JUDGED_KIND kind = JUDGED_KIND::End;
     T_END_PLACE place; // of a joint: its column
@@ -54,6 +55,8 @@ struct T_JUDGED_END {
     /// The code of Code.
     HINGE_CODE By() const { return joint ? joint->joint.code : member.code; }
     const T_LEVELS& Levels() const;
+    /// N, M, V of its states are known.
+    bool HasForces() const { return joint ? basis != JUDGE_BASIS::Nothing : axes.length > 0.0; }
     std::string Code() const; // "EN1998-3", "hinge type", ""
 };
 

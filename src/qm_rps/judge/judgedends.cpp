@@ -97,8 +97,11 @@ public:
         m_tie = 0.0;
         m_any.place.element = id;
         const std::size_t up = VerticalAxis(m_model);
+        const int other = element.kind == ELEM_KIND::Spring ? element.nodeI : element.nodeJ;
         m_any.storey = StoreyAt(m_lookup.run, std::max(m_model.nodes.at(element.nodeI).xyz[up],
-                                                       m_model.nodes.at(element.nodeJ).xyz[up]));
+                                                       m_model.nodes.at(other).xyz[up]));
+        if (element.kind == ELEM_KIND::Link || element.kind == ELEM_KIND::Spring)
+            return AddSpring();
         const std::optional<T_MEMBER_AXES> axes = AxesOf(m_model, element);
         if (axes) m_any.axes = *axes;
         std::optional<HINGE_CODE> code = m_options.code;
@@ -151,20 +154,36 @@ private:
             }
     }
 
+    /// About the axes that have a hinge at either end.
     void AddByCriteria()
     {
         m_any.why = Say("IDS_QM_JUDGE_NO_DATA");
-        for (const HINGE_COMPONENT component : {HINGE_COMPONENT::My, HINGE_COMPONENT::Mz})
-            for (const bool atJ : {false, true}) {
-                T_JUDGED_END end = EndAt(component, atJ);
-                if (end.hinge < 0) continue;
-                PutCriteria(m_lookup, end);
+        for (const HINGE_COMPONENT component : {HINGE_COMPONENT::My, HINGE_COMPONENT::Mz}) {
+            std::array<T_JUDGED_END, 2> ends{EndAt(component, false), EndAt(component, true)};
+            if (ends[0].hinge < 0 && ends[1].hinge < 0) continue;
+            const auto& release = m_model.elements.at(m_any.place.element).release;
+            for (T_JUDGED_END& end : ends) {
+                const T_DIRS6& free = end.place.atJ ? release.J : release.I;
+                if (end.hinge >= 0)
+                    PutCriteria(m_lookup, end);
+                else
+                    end.why =
+                        Say(free[static_cast<std::size_t>(component)] ? "IDS_QM_PUSH_HINGE_RELEASED"
+                                                                      : "IDS_QM_JUDGE_NO_HINGE");
                 m_out.push_back(std::move(end));
             }
+        }
     }
 
-    /// A brace of steel by a code, else any truss by the criteria of its hinge; without either
-    /// there is nothing to judge, and no row.
+    void AddSpring()
+    {
+        m_any.kind = JUDGED_KIND::Spring;
+        m_any.why = Say("IDS_QM_JUDGE_SPRING");
+        m_out.push_back(m_any);
+    }
+
+    /// A brace of steel by a code, else any truss by the criteria of its hinge; without either a
+    /// row that says so.
     void AddBrace(bool hasAxes, std::optional<HINGE_CODE> code, bool secondary)
     {
         T_JUDGED_END end = m_any;
@@ -185,10 +204,10 @@ private:
                 end.member =
                     EndOf(m_model, member, {*code, secondary}, HINGE_COMPONENT::My, true, 0.0);
             }
-        } else if (end.hinge < 0) {
-            return;
-        } else {
+        } else if (end.hinge >= 0) {
             PutCriteria(m_lookup, end);
+        } else {
+            end.why = Say(code ? "IDS_QM_JUDGE_TRUSS" : "IDS_QM_JUDGE_NO_DATA");
         }
         m_out.push_back(std::move(end));
     }
@@ -199,8 +218,9 @@ private:
         std::string ignored;
         HINGE_COMPONENT component = HINGE_COMPONENT::My;
         if (ReadMember(m_model, m_any.place.element, CInitialAxial(), member, ignored)) {
+            if (member.kind == MEMBER_KIND::Brace) return AddBrace(true, {}, false);
             m_any.column = IsUpright(member.kind);
-            component = member.bending.front();
+            if (!member.bending.empty()) component = member.bending.front();
         }
         for (const bool atJ : {false, true})
             m_out.push_back(EndAt(component, atJ));
@@ -316,6 +336,13 @@ std::optional<HINGE_CODE> HingeCodeNamed(const std::string& name)
     return static_cast<HINGE_CODE>(at - kHingeCodeNames.begin());
 }
 
+std::vector<std::string> JudgedCodeNames()
+{
+    std::vector<std::string> names(kHingeCodeNames.begin(), kHingeCodeNames.end());
+    std::erase(names, kHingeCodeNames[static_cast<std::size_t>(HINGE_CODE::Aisc342)]);
+    return names;
+}
+
 std::vector<T_JUDGED_END> JudgedEnds(const T_MODEL& model, const T_PUSH_RUN& run,
                                      const T_JUDGE_OPTIONS& options)
 {
@@ -323,8 +350,7 @@ std::vector<T_JUDGED_END> JudgedEnds(const T_MODEL& model, const T_PUSH_RUN& run
     const CLookup lookup(model, run);
     CEndsOf ends(lookup, options, out);
     for (const auto& [id, element] : model.elements)
-        if (element.kind == ELEM_KIND::Beam || element.kind == ELEM_KIND::Truss)
-            ends.Add(id, element);
+        ends.Add(id, element);
     CJoints joints(lookup, options, out);
     for (const auto& [node, around] : BeamsByNode(model))
         joints.Add(node, around);

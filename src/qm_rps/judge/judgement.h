@@ -61,10 +61,12 @@ struct T_JUDGE_OPTIONS {
 
 /// "EN1998-3"; empty: there is no such code.
 std::optional<HINGE_CODE> HingeCodeNamed(const std::string& name);
+/// Codes that all members may be judged by: not AISC 342, which knows columns of steel alone.
+std::vector<std::string> JudgedCodeNames();
 
 /// The ends of the beam elements: about the axes that a code or their hinges bend them, else one
-/// row that says why there is nothing to judge; braces; then the joints of columns with beams by
-/// their nodes, in each plane that has beams. `run`: its hinges and storeys.
+/// row that says why there is nothing to judge; trusses, links and springs; then the joints of
+/// columns with beams by their nodes, in each plane that has beams. `run`: its hinges and storeys.
 std::vector<T_JUDGED_END> JudgedEnds(const T_MODEL& model, const T_PUSH_RUN& run,
                                      const T_JUDGE_OPTIONS& options);
 

@@ -24,14 +24,21 @@ VERDICT T_JUDGEMENT::Verdict() const
 {
     VERDICT verdict = states.empty() ? VERDICT::NotChecked : VERDICT::Fulfilled;
     for (const T_JUDGED_STATE& state : states) {
-        const auto& count = state.all.count;
-        if (count[static_cast<std::size_t>(VERDICT::NotFulfilled)] > 0)
-            return VERDICT::NotFulfilled;
-        if (state.found != AT_POINT::Reached ||
-            count[static_cast<std::size_t>(VERDICT::NotChecked)] > 0)
-            verdict = VERDICT::NotChecked;
+        const VERDICT of = VerdictOf(state);
+        if (of == VERDICT::NotFulfilled) return of;
+        if (of == VERDICT::NotChecked) verdict = of;
     }
     return verdict;
+}
+
+VERDICT VerdictOf(const T_JUDGED_STATE& state)
+{
+    const auto& count = state.all.count;
+    if (count[static_cast<std::size_t>(VERDICT::NotFulfilled)] > 0) return VERDICT::NotFulfilled;
+    const bool isWhole = state.found == AT_POINT::Reached &&
+                         count[static_cast<std::size_t>(VERDICT::NotChecked)] == 0 &&
+                         count[static_cast<std::size_t>(VERDICT::Fulfilled)] > 0;
+    return isWhole ? VERDICT::Fulfilled : VERDICT::NotChecked;
 }
 
 const T_JUDGED_STATE* WorstState(const T_JUDGEMENT& judgement)

@@ -115,8 +115,10 @@ T_PLACE_TEXT PlaceOf(const T_JUDGED_END& end)
         return {Say("IDS_QM_JUDGE_NODE", std::to_string(end.joint->node)), "",
                 kAxisNames[end.joint->along]};
     return {std::to_string(end.place.element),
-            end.kind == JUDGED_KIND::Brace ? "" : (end.place.atJ ? "J" : "I"),
-            kComponentNames[static_cast<std::size_t>(end.place.component)]};
+            end.kind != JUDGED_KIND::End ? "" : (end.place.atJ ? "J" : "I"),
+            end.kind == JUDGED_KIND::Spring
+                ? ""
+                : kComponentNames[static_cast<std::size_t>(end.place.component)]};
 }
 
 std::optional<double> Known(double value)
@@ -146,6 +148,12 @@ std::string VerdictCountText(const T_VERDICT_COUNT& count)
     return text;
 }
 
+std::string WholeVerdictText(const T_JUDGEMENT& judgement)
+{
+    const std::string text = Say("IDS_QM_JUDGE_WHOLE", VerdictText(judgement.Verdict()));
+    return judgement.stale.empty() ? text : text + " (" + Say("IDS_QM_JUDGE_WHOLE_STALE") + ")";
+}
+
 std::string ModeText(JUDGE_MODE mode)
 {
     constexpr std::array<const char*, kModes> kKeys{"IDS_QM_JUDGE_ROTATION", "IDS_QM_JUDGE_SHEAR",
@@ -157,7 +165,10 @@ std::string ModeText(JUDGE_MODE mode)
 std::string EndText(const T_JUDGED_END& end)
 {
     const T_PLACE_TEXT place = PlaceOf(end);
-    return place.what + (place.end.empty() ? "" : " " + place.end) + " " + place.axis;
+    std::string text = place.what;
+    for (const std::string& part : {place.end, place.axis})
+        if (!part.empty()) text += " " + part;
+    return text;
 }
 
 std::vector<std::string> UncheckedTexts(const T_JUDGED_STATE& state)
@@ -205,9 +216,11 @@ T_JUDGED_CELLS CellsOf(const T_JUDGEMENT& judgement, const T_JUDGED_STATE& state
     to.Text(C::Axis, place.axis);
     to.Text(C::Storey, end.storey);
     to.Text(C::Code, end.Code());
-    to.Number(C::N, row.state.N);
-    to.Number(C::M, row.state.M);
-    to.Number(C::V, row.state.V);
+    if (end.HasForces()) {
+        to.Number(C::N, row.state.N);
+        to.Number(C::M, row.state.M);
+        to.Number(C::V, row.state.V);
+    }
     to.Number(C::Span, Known(row.checks.LV));
     to.Number(C::ThetaY, Known(row.checks.thetaY));
     bool any = false;
@@ -245,6 +258,7 @@ std::vector<std::string> JudgementNotes(const T_JUDGEMENT& judgement)
     const auto add = [&](const std::string& note) {
         if (std::ranges::find(notes, note) == notes.end()) notes.push_back(note);
     };
+    if (!judgement.stale.empty()) add(judgement.stale);
     if (judgement.LeastSure() != CODE_MARK::Computed) add(Say("IDS_QM_JUDGE_UNSURE"));
     if (std::ranges::any_of(judgement.ends, [](const T_JUDGED_END& end) {
             return end.basis == JUDGE_BASIS::Code && !IsChordCode(end.By()) &&

@@ -54,6 +54,8 @@ inline const T_JUDGED_CELL& At(const T_JUDGED_CELLS& cells, JUDGED_COLUMN column
 /// "fulfilled" ..., "rotation", "shear", in the chosen language.
 std::string VerdictText(VERDICT verdict);
 std::string ModeText(JUDGE_MODE mode);
+/// "Whole: fulfilled", with the remark that hinges are stale where they are.
+std::string WholeVerdictText(const T_JUDGEMENT& judgement);
 /// "fulfilled 3, not fulfilled 1, not checked 0; joints of these 1, 0, 0".
 std::string VerdictCountText(const T_VERDICT_COUNT& count);
 /// "3 J My", "3 Fx", "node 5 X".

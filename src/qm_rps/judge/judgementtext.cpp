@@ -6,6 +6,7 @@
 #include "qm_rps/push/pushatpointtext.h"
 
 #include <algorithm>
+#include <cmath>
 
 namespace {
 
@@ -130,11 +131,20 @@ std::string DriftLine(const T_JUDGED_STATE& state)
 
 std::string StateLines(const T_JUDGEMENT& j, const T_JUDGED_STATE& state, const T_SHOWN_ROWS& rows)
 {
-    const std::string at = Number(FromSi(state.point.displacement, j.units, kDimLength)) + " " +
-                           std::string(NameOf(j.units.length));
-    std::string text = "\n" + Say("IDS_QM_JUDGE_STATE", StateAtText(j, state), at);
+    const auto shown = [&](double si) {
+        return Number(FromSi(si, j.units, kDimLength)) + " " + std::string(NameOf(j.units.length));
+    };
+    std::string text =
+        "\n" + Say("IDS_QM_JUDGE_STATE", StateAtText(j, state), shown(state.point.displacement));
+    // The push begins where the initial loads have moved the control node to.
+    if (const std::string own = shown(std::fabs(state.point.displacement - j.start));
+        own != shown(std::fabs(state.point.displacement)))
+        text += " (" + Say("IDS_QM_JUDGE_FROM_START", own) + ")";
     if (state.found != AT_POINT::Reached)
         return text + ": " + VerdictText(VERDICT::NotChecked) + " (" + WhyNot(state.found) + ")\n";
+    if (state.rows.empty())
+        return text + ": " + VerdictText(VERDICT::NotChecked) + " (" + Say("IDS_QM_JUDGE_NO_END") +
+               ")\n";
     text += ": " + VerdictCountText(state.all) + '\n';
     for (const T_VERDICT_COUNT& storey : state.storeys)
         if (!storey.storey.empty())
@@ -158,8 +168,6 @@ std::vector<std::string> LimitCells(const T_JUDGEMENT& j, const T_JUDGED_LIMIT& 
     const double demand = limit.demand.value_or(0.0);
     const std::string ratio =
         text(limit.capacity && demand > 0.0, limit.capacity.value_or(0.0) / demand);
-    const std::string product = text(limit.factor && limit.demandPga,
-                                     limit.factor.value_or(0.0) * limit.demandPga.value_or(0.0));
     std::string remark = limit.why;
     if (limit.first.unchecked > 0 && limit.first.unchecked < limit.first.all)
         remark += (remark.empty() ? "" : "; ") +
@@ -170,9 +178,9 @@ std::vector<std::string> LimitCells(const T_JUDGEMENT& j, const T_JUDGED_LIMIT& 
             shown(limit.capacity),
             shown(limit.demand),
             ratio,
-            Number(limit.factor),
-            product,
-            Number(limit.demandPga),
+            Number(limit.PgaRatio()),
+            Number(limit.CapacityPga()),
+            Number(limit.DemandPga()),
             remark};
 }
 
@@ -214,7 +222,7 @@ std::string Whole(const T_JUDGEMENT& j, const T_SHOWN_ROWS& rows)
     if (!j.note.empty()) return text + "  " + j.note + '\n';
     for (const T_JUDGED_STATE& state : j.states)
         text += StateLines(j, state, rows);
-    text += LimitLines(j) + '\n';
+    text += LimitLines(j) + '\n' + WholeVerdictText(j) + '\n';
     for (const std::string& line : JudgementNotes(j))
         text += "! " + line + '\n';
     return text;
@@ -243,7 +251,8 @@ std::string JudgedLimitsText(const T_JUDGEMENT& j)
         if (limit.first.end)
             text +=
                 Say("IDS_QM_JUDGE_PASS", cells[2], cells[3] + " " + unit, cells[4] + " " + unit);
-        if (limit.factor) text += "; PGA_C/PGA_D = " + cells[6] + ", PGA_C = " + cells[7] + " g";
+        if (limit.PgaRatio())
+            text += "; PGA_C/PGA_D = " + cells[6] + ", PGA_C = " + cells[7] + " g";
         if (!cells[9].empty()) text += (limit.first.end ? "; " : "") + cells[9];
     }
     return text;

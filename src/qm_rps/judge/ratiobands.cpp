@@ -46,7 +46,8 @@ T_RATIO_BANDS RatioBands(const T_JUDGEMENT& judgement, const T_JUDGED_STATE& sta
             put(joints, end.joint->node, BandOf(row));
         else
             put(bands, place, BandOf(row));
-        if (end.kind == JUDGED_KIND::Brace) put(bands, std::pair(place.first, true), BandOf(row));
+        if (end.kind == JUDGED_KIND::Brace || end.kind == JUDGED_KIND::Spring)
+            put(bands, std::pair(place.first, true), BandOf(row));
     }
     T_RATIO_BANDS out;
     for (std::size_t i = 0; i < scene.lines.size(); ++i)

@@ -1,6 +1,6 @@
 // The checks of a member end, where shear is read, and the first pass of a limit, against hand
 // values and tests/oracle/judgement.py, which shares no line with the program.
-#include "qm_rps/judge/judgement.h"
+#include "qm_rps/judge/judgementresult.h"
 #include "qm_rps/judge/spectrumfactor.h"
 
 #include <gtest/gtest.h>
@@ -227,6 +227,31 @@ TEST(Judgement, CountsAndSortsByVerdictAndRatio)
     ASSERT_EQ(2U, state.storeys.size());
     EXPECT_EQ((std::array<std::size_t, 3>{0, 1, 1}), state.storeys[0].count);
     EXPECT_EQ("nothing known", state.rows.back().checks.Of(kShear)->why);
+}
+
+// Without a row nothing was judged; a point beyond the push was not, either.
+TEST(Judgement, NothingToJudgeIsNotFulfilled)
+{
+    T_JUDGEMENT judged;
+    EXPECT_EQ(VERDICT::NotChecked, judged.Verdict());
+    T_JUDGED_STATE& state = judged.states.emplace_back();
+    const struct {
+        AT_POINT found;
+        std::array<std::size_t, 3> count; // fulfilled, not fulfilled, not checked
+        VERDICT verdict;
+    } kCases[] = {
+        {AT_POINT::Reached, {0, 0, 0}, VERDICT::NotChecked},
+        {AT_POINT::Reached, {1, 0, 0}, VERDICT::Fulfilled},
+        {AT_POINT::Reached, {1, 0, 1}, VERDICT::NotChecked},
+        {AT_POINT::Reached, {1, 1, 1}, VERDICT::NotFulfilled},
+        {AT_POINT::Beyond, {0, 0, 0}, VERDICT::NotChecked},
+    };
+    for (const auto& c : kCases) {
+        state.found = c.found;
+        state.all.count = c.count;
+        EXPECT_EQ(c.verdict, VerdictOf(state));
+        EXPECT_EQ(c.verdict, judged.Verdict());
+    }
 }
 
 // End 0 passes 0.02 at 0.4 of the way from 1 to 2, end 1 at 0.3: displacement 1.3, reaction 13.
