@@ -1,6 +1,6 @@
 // The arguments of the commands on pushover evaluations.
 #include "evaluatecommands.h"
-#include "qm_rps/generate/codeside.h"
+#include "qm_rps/judge/judgement.h"
 #include "registershared.h"
 #include "registrations.h"
 #include "verifycommand.h"
@@ -17,8 +17,7 @@ void AddEvaluate(CLI::App& app, EXIT_CODE& code)
     AddJson(sub, o->json);
     auto* const report = sub->add_option("--report", o->report, Say("IDS_QM_HELP_EVALUATE_REPORT"));
     sub->add_option("--code", o->code, Say("IDS_QM_HELP_EVALUATE_CODE"))
-        ->check(
-            CLI::IsMember(std::vector<std::string>(kHingeCodeNames.begin(), kHingeCodeNames.end())))
+        ->check(CLI::IsMember(JudgedCodeNames()))
         ->needs(report);
     sub->add_option("--curve", o->curve, Say("IDS_QM_HELP_EVALUATE_CURVE"));
     sub->add_option("--plot", o->plot, Say("IDS_QM_HELP_EVALUATE_PLOT"));

@@ -10,6 +10,8 @@
 #include "qm_ui/push/judgeview.h"
 #include "qm_ui/push/pushresultviews.h"
 
+#include <algorithm>
+
 namespace {
 
 /// Runs the dialog of a model class on the document.
@@ -67,6 +69,11 @@ std::unique_ptr<CPushOverHingeStateDlg> AtPoint(CDBDoc& doc)
     return dialog;
 }
 
+int IndexOf(const std::vector<std::string>& texts, const std::string& text)
+{
+    return static_cast<int>(std::ranges::find(texts, text) - texts.begin());
+}
+
 /// The ends of the frame by EN 1998-3, at the demands of its evaluation.
 std::unique_ptr<CPushOverJudgementDlg> Judged(CDBDoc& doc)
 {
@@ -75,7 +82,7 @@ std::unique_ptr<CPushOverJudgementDlg> Judged(CDBDoc& doc)
     T_PUSH_EVALUATION evaluation;
     std::string error;
     if (EvaluateStored(doc, "PX EC8", evaluation, error) && dialog->OnJudge(evaluation, {}, error))
-        dialog->OnSelChangeCode(static_cast<int>(HINGE_CODE::En1998) + 1);
+        dialog->OnSelChangeCode(IndexOf(dialog->CodeTexts(), "EN1998-3"));
     return dialog;
 }
 

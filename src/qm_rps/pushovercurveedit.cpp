@@ -325,6 +325,7 @@ int CPushOverCurveEdit::OnJudge()
 {
     return ShowAtPoints<CPushOverJudgementDlg>(
         [this](auto& judged, const PUSH_PROGRESS_FN& progress, std::string& why) {
+            judged.m_askFile = [this] { return AskPath("IDS_QM_UI_SECC_FILES"); };
             return judged.OnJudge(m_shown.Result(), progress, why);
         });
 }

@@ -2,6 +2,8 @@
 
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
+#include "qm_db/filectrl.h"
+#include "qm_rps/judge/judgementsheet.h"
 #include "qm_rps/judge/judgementtext.h"
 #include "qm_rps/push/pushatpointtext.h"
 
@@ -24,21 +26,26 @@ int CPushOverJudgementDlg::OnJudge(const T_PUSH_EVALUATION& result,
 std::vector<std::string> CPushOverJudgementDlg::CodeTexts() const
 {
     std::vector<std::string> texts{Say("IDS_QM_UI_JUDGE_OF_HINGES")};
-    texts.insert(texts.end(), kHingeCodeNames.begin(), kHingeCodeNames.end());
+    const std::vector<std::string> codes = JudgedCodeNames();
+    texts.insert(texts.end(), codes.begin(), codes.end());
     return texts;
 }
 
 int CPushOverJudgementDlg::CodeIndex() const
 {
-    return m_options.code ? static_cast<int>(*m_options.code) + 1 : 0;
+    if (!m_options.code) return 0;
+    const std::vector<std::string> texts = CodeTexts();
+    const char* const name = kHingeCodeNames[static_cast<std::size_t>(*m_options.code)];
+    return static_cast<int>(std::ranges::find(texts, name) - texts.begin());
 }
 
 void CPushOverJudgementDlg::OnSelChangeCode(int index)
 {
     const T_JUDGE_OPTIONS before = m_options;
     m_options.code.reset();
-    if (index > 0 && index <= std::ssize(kHingeCodeNames))
-        m_options.code = static_cast<HINGE_CODE>(index - 1);
+    const std::vector<std::string> texts = CodeTexts();
+    if (index > 0 && index < std::ssize(texts))
+        m_options.code = HingeCodeNamed(texts[static_cast<std::size_t>(index)]);
     std::string error;
     if (m_options == before || OnJudge(T_PUSH_EVALUATION(m_result), {}, error)) return;
     m_options = before;
@@ -118,4 +125,22 @@ std::string CPushOverJudgementDlg::TitleText() const
     return Say("IDS_QM_JUDGE_TITLE", m_judgement.evaluation, m_judgement.push,
                std::string(NameOf(m_judgement.units.force)),
                std::string(NameOf(m_judgement.units.length)));
+}
+
+std::string CPushOverJudgementDlg::VerdictText() const
+{
+    return WholeVerdictText(m_judgement);
+}
+
+int CPushOverJudgementDlg::OnExport()
+{
+    const std::string path = m_askFile ? m_askFile() : std::string();
+    if (path.empty()) return 1;
+    const std::span<const T_JUDGEMENT> judged(&m_judgement, 1);
+    T_FILE_ERROR error;
+    if (path.ends_with(".xlsx") ? WriteSheet(path, JudgementSheet(judged), error)
+                                : CFileCtrl::WriteWholeFile(path, JudgementCsv(judged), error))
+        return 1;
+    ShowMessage("IDS_QM_UI_JUDGE_NO_EXPORT", error.text);
+    return 0;
 }

@@ -7,6 +7,8 @@
 #include "qm_rps/judge/ratiobands.h"
 #include "qm_rps/judgedevaluation.h"
 
+#include <functional>
+
 class CPushOverJudgementDlg : public zql::frx::MDialog {
 public:
     explicit CPushOverJudgementDlg(CDBDoc& doc) : m_doc(doc), m_scene(doc) {}
@@ -33,6 +35,14 @@ public:
     std::string LimitsText() const;
     std::string NotesText() const;
     std::string TitleText() const;
+    /// The verdict of all limit states, and what must be said with it.
+    std::string VerdictText() const;
+
+    /// Asks for a file to write; set by the application. Empty: cancelled.
+    std::function<std::string()> m_askFile;
+    /// Writes the rows of all limit states as .xlsx or, with another ending, as values with commas.
+    /// 1 written, or cancelled; 0 with a message.
+    int OnExport();
 
     /// The shown state on the frame; null: none is shown.
     const T_JUDGED_STATE* State() const;

@@ -56,8 +56,10 @@ EXIT_CODE FindEvaluations(CDBDoc& doc, const T_JUDGE_COMMAND& o, std::vector<T_E
 EXIT_CODE CheckFiles(const T_JUDGE_COMMAND& o, std::size_t count)
 {
     if (const EXIT_CODE code = CheckPlotName(o.plot); code != EXIT_CODE::Done) return code;
-    std::vector<T_OUTPUT> outputs{
-        {o.json, OUTPUT_KIND::Json}, {o.report, OUTPUT_KIND::Text}, {o.sheet, OUTPUT_KIND::Sheet}};
+    std::vector<T_OUTPUT> outputs{{o.json, OUTPUT_KIND::Json},
+                                  {o.report, OUTPUT_KIND::Text},
+                                  {o.sheet, OUTPUT_KIND::Sheet},
+                                  {o.csv, OUTPUT_KIND::Text}};
     for (std::size_t i = 0; i < count && !o.plot.empty(); ++i)
         outputs.push_back({NumberedPath(o.plot, i, count), OUTPUT_KIND::Picture});
     return CheckOutputs(o.file, outputs, o.overwrite);
@@ -118,6 +120,8 @@ EXIT_CODE WriteAll(CDBDoc& doc, const T_JUDGE_COMMAND& o,
         }
         code = WriteOutput(o.report, text);
     }
+    if (code == EXIT_CODE::Done && !o.csv.empty())
+        code = WriteOutput(o.csv, JudgementCsv(judgements));
     T_FILE_ERROR error;
     if (code == EXIT_CODE::Done && !o.sheet.empty() &&
         !WriteSheet(o.sheet, JudgementSheet(judgements), error))

@@ -14,7 +14,7 @@ struct T_JUDGE_COMMAND {
     std::string members = "primary";      // with `code`: or "secondary"
     std::string level;                    // limit state; empty: all
     T_JUDGE_FACTORS factors;
-    std::string json, report, sheet, plot;
+    std::string json, report, sheet, csv, plot;
     bool trace = false, all = false; // all: rows on a terminal
     bool overwrite = false, noStore = false;
 };

@@ -10,8 +10,7 @@ void AddJudge(CLI::App& app, EXIT_CODE& code)
     AddFile(sub, o->file);
     sub->add_option("--evaluation", o->evaluations, Say("IDS_QM_HELP_JUDGE_EVALUATION"));
     auto* const by = sub->add_option("--code", o->code, Say("IDS_QM_HELP_JUDGE_CODE"))
-                         ->check(CLI::IsMember(std::vector<std::string>(kHingeCodeNames.begin(),
-                                                                        kHingeCodeNames.end())));
+                         ->check(CLI::IsMember(JudgedCodeNames()));
     sub->add_option("--level", o->members, Say("IDS_QM_HELP_JUDGE_MEMBERS"))
         ->check(CLI::IsMember({"primary", "secondary"}))
         ->needs(by);
@@ -32,6 +31,7 @@ void AddJudge(CLI::App& app, EXIT_CODE& code)
     AddJson(sub, o->json);
     sub->add_option("--report", o->report, Say("IDS_QM_HELP_JUDGE_REPORT"));
     sub->add_option("--sheet", o->sheet, Say("IDS_QM_HELP_JUDGE_SHEET"));
+    sub->add_option("--csv", o->csv, Say("IDS_QM_HELP_JUDGE_CSV"));
     sub->add_option("--plot", o->plot, Say("IDS_QM_HELP_JUDGE_PLOT"));
     AddOverwrite(sub, o->overwrite);
     sub->add_flag("--no-store", o->noStore, Say("IDS_QM_HELP_ANALYSE_NO_STORE"));

@@ -1,6 +1,8 @@
 #include "qm_rps/judge/judgementsheet.h"
 
 #include "qm_base/say.h"
+#include "qm_base/textformat.h"
+#include "qm_rps/section/sectionexport.h"
 
 namespace {
 
@@ -96,4 +98,22 @@ T_SHEET JudgementSheet(std::span<const T_JUDGEMENT> judgements)
     PutCounts(sheet, row, count);
     sheet.widths = {{0, 0, 16.0}, {ColumnOf(C::Governing), ColumnOf(C::Reason), 18.0}};
     return sheet;
+}
+
+std::string JudgementCsv(std::span<const T_JUDGEMENT> judgements)
+{
+    if (judgements.empty()) return {};
+    T_TEXT_TABLE table;
+    table.columns.push_back({Say("IDS_QM_JUDGE_EVALUATION"), false});
+    for (const std::string& head : JudgedHeads(judgements.front().units))
+        table.columns.push_back({head, false});
+    for (const T_JUDGEMENT& j : judgements)
+        for (const T_JUDGED_STATE& state : j.states)
+            for (const T_JUDGED_ROW& judged : state.rows) {
+                std::vector<std::string>& cells = table.rows.emplace_back();
+                cells.push_back(j.evaluation);
+                for (const T_JUDGED_CELL& cell : CellsOf(j, state, judged))
+                    cells.push_back(cell.number ? FormatText("%.9g", *cell.number) : cell.text);
+            }
+    return TableCsv(table);
 }

@@ -45,6 +45,7 @@ void Build(CFormView& form, MODEL& d)
             [&d] { return d.CodeTexts(); })
         .name = "code";
     form.EndColumns();
+    form.Note([&d] { return d.VerdictText(); });
     form.Note([&d] { return d.CountText(); });
     CFormField& frame = form.Custom({}, std::make_unique<CJudgedFrame>(d, form.Host()));
     frame.name = "frame";
@@ -58,6 +59,7 @@ void Build(CFormView& form, MODEL& d)
     CFormField& grid = form.Grid(std::move(table));
     grid.name = "ends";
     grid.widget->setMinimumHeight(220);
+    form.Button(KeyText("IDS_QM_UI_JUDGE_EXPORT"), [&d] { (void)d.OnExport(); }).name = "export";
     form.Note([&d] { return d.LimitsText(); });
     form.Note([&d] { return d.NotesText(); });
 }
