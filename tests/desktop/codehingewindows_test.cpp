@@ -331,6 +331,22 @@ TEST_F(CodeHingeWindows, BeamsOfSteelTakeTheirConnection)
     ASSERT_EQ(1U, Model().hingeTypes.size());
     const T_STEEL_CONNECTION kept{"RBS", 0.0, 0.0107, 0.75};
     EXPECT_EQ(kept, Model().hingeTypes.begin()->second.generated->connection);
+    T_SECT_D beam;
+    ASSERT_TRUE(m_main->Doc().Attr().GetSect(2, beam));
+    beam.size[1] = 0.16;
+    {
+        CEditScope edit(m_main->Doc(), "Wider flanges");
+        ASSERT_TRUE(edit.Put(2, beam) && edit.Commit());
+    }
+    Show([&](CDialogWindow& w) {
+        Push(w, "IDS_QM_UI_GEN_STALE_BTN");
+        EXPECT_EQ("RBS", qobject_cast<QComboBox*>(Field(w, "connection"))->currentText());
+        EXPECT_EQ("0.0107", TextAt(w, "continuityPlate"));
+        EXPECT_EQ("", TextAt(w, "columnFlange"));
+        Push(w, "IDS_QM_UI_GEN_APPLY");
+        Cancel(w);
+    });
+    EXPECT_EQ(kept, Model().hingeTypes.begin()->second.generated->connection);
 }
 
 TEST_F(CodeHingeWindows, HingesArePushedEvaluatedAndJudgedAsByCommands)
