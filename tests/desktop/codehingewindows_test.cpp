@@ -318,7 +318,7 @@ TEST_F(CodeHingeWindows, BeamsOfSteelTakeTheirConnection)
         ChooseIndex(Field(w, "connection"), 6);
         Enter(w, "panelRatio", "-0.75");
         Push(w, "IDS_QM_UI_GEN_PREVIEW");
-        EXPECT_TRUE(Says(w, "Vpz/Vye (empty: of the frame): -0.75, expected above 0"));
+        EXPECT_TRUE(Says(w, "Panel zone, Vpz/Vye: -0.75, expected above 0"));
         Enter(w, "panelRatio", "0.75");
         Push(w, "IDS_QM_UI_GEN_PREVIEW");
         EXPECT_NEAR(0.8 * (0.050 - 0.0003 * 300 / 25.4), traced(w, "a"), 1e-6);

@@ -109,14 +109,20 @@ void AddConnection(CFormView& form, DLG& d)
                                    [] { return CCodeHingeOptions::ConnectionTexts(); });
     kind.name = "connection";
     kind.shown = [&d] { return d.AsksConnection(); };
+    const auto asked = [&d] { return d.AsksConnection() && d.m_options.m_connection > 0; };
     for (std::size_t i = 0; i < kConnectionMeasures.size(); ++i) {
         const T_CONNECTION_MEASURE& measure = kConnectionMeasures[i];
         CFormField& field = form.Optional(
-            [&o, &measure] { return HeadWithUnit(Say(measure.key), measure.dim, o.Units()); },
+            [&o, &measure] {
+                const bool number = measure.dim == kDimNone;
+                return HeadWithUnit(Say(measure.key),
+                                    number ? std::nullopt : std::optional(measure.dim), o.Units());
+            },
             Option(d, o.m_measures[i]));
         field.name = measure.name;
-        field.shown = [&d] { return d.AsksConnection() && d.m_options.m_connection > 0; };
+        field.shown = asked;
     }
+    form.Note(KeyText("IDS_QM_UI_GEN_MEASURES")).shown = asked;
 }
 
 void AddOptions(CFormView& form, DLG& d)
