@@ -344,10 +344,10 @@ TEST_F(Judge, StaleHingesAreSaidWithTheVerdict)
     ExpectHolds(Done("judge old.json --report old.txt --csv old.csv"),
                 {"by hinges that are stale"});
     ExpectHolds(Text("old.txt"), {"by hinges that are stale"});
-    ExpectHolds(Text("old.csv"), {"SD (", ",fulfilled"});
+    ExpectHolds(Text("old.csv"), {"E,SD,1,I,My", ",fulfilled"});
 }
 
-// A link to the ground and a tie without hinges carry forces that nothing is known of; a beam of
+// Nothing is known of a spring to the ground, nor of a tie without a hinge; a beam of
 // steel with pins at both ends has no axis about which it is bent.
 TEST_F(Judge, WhatHasNoLimitsKeepsTheWholeFromBeingFulfilled)
 {
@@ -371,11 +371,11 @@ TEST_F(Judge, WhatHasNoLimitsKeepsTheWholeFromBeingFulfilled)
     file["nodes"].push_back({{"id", 3}, {"xyz", {2, 0, 0}}, {"restraint", {1, 1, 1, 1, 1, 1}}});
     json pinned = file["elements"][0];
     pinned["id"] = 7;
-    pinned["nodes"] = {3, 2};
+    pinned["nodes"] = {1, 3};
     pinned["material"] = "S";
     pinned["release"] = {{"I", {"Ry", "Rz"}}, {"J", {"Ry", "Rz"}}};
     json tie = {
-        {"id", 7}, {"kind", "truss"}, {"nodes", {3, 2}}, {"material", "S"}, {"section", "column"}};
+        {"id", 7}, {"kind", "truss"}, {"nodes", {1, 3}}, {"material", "S"}, {"section", "column"}};
     for (const json& element : {pinned, tie}) {
         with = file;
         with["elements"].push_back(element);
