@@ -18,7 +18,7 @@ T_JUDGED_END Foot(HINGE_CODE code, MEMBER_KIND kind)
     end.basis = JUDGE_BASIS::Code;
     end.member.code = code;
     end.member.kind = kind;
-    end.member.clear = end.member.length = 3.0;
+    end.member.clear = 3.0;
     end.member.EI = 4e8, end.member.GA = 3e8;
     end.member.material.knowledge = MATL_KNOWLEDGE::KL2;
     return end;
