@@ -96,7 +96,7 @@ TEST_F(CodeMasonry, BlocksLimitSlidingAndOffsetsDoNotBend)
     EXPECT_EQ(std::string::npos, Done("hinge check g.json").find("generated"));
     ExpectHolds(
         Done("hinge generate c.json --elements 1 --code Circolare2019 -o g.json --overwrite"),
-        "fb of the blocks is not given");
+        {"fb of the blocks is not given"});
     // 0.065 1000/(0.7 1.2) = 77.38 kPa: 1.5 0.45 77.38/(1 + 1.35 77.38/300), less than the
     // diagonal.
     file["materials"][0]["masonry"]["fb"] = 1000;

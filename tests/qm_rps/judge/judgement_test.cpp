@@ -30,7 +30,7 @@ T_JUDGED_END Column(HINGE_CODE code)
     T_MEMBER_END& m = end.member;
     m.code = code;
     m.kind = MEMBER_KIND::Column;
-    m.clear = m.length = 3.0;
+    m.clear = 3.0;
     m.EI = 15e9 * std::pow(0.4, 4) / 12.0;
     m.section.name = "column";
     m.section.shape = SECT_SHAPE::Rectangle;
