@@ -30,7 +30,7 @@ struct T_STEEL_PLASTIC_STRENGTH {
 struct T_EN_INTERACTION {
     double MNy = 0.0, MNz = 0.0; // reduced by the axial force
     double alpha = 1.0, beta = 1.0;
-    double ratio = 0.0; // (My/MNy)^alpha + (Mz/MNz)^beta
+    double ratio = 0.0; // M/MN about one axis; (My/MNy)^alpha + (Mz/MNz)^beta about both
 };
 /// EN 1993-1-1 6.2.9.1, sections of class 1 and 2.
 std::optional<T_EN_INTERACTION> EnAxialBending(const T_STEEL_SHAPE& s,

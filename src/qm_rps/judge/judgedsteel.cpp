@@ -116,15 +116,8 @@ bool EnAxial(const T_CHECKING& c, const T_STEEL_BASIS& in, bool withMoments, CCo
         check.at.fill(T_CHECK{alone, 1.0});
         return true;
     }
-    // 6.2.9.1(2) bends about one axis, (6) about both.
-    const T_STEEL_FORCES f = ForcesOf(in.end, s.N, s.M, s.across);
-    const double y = std::fabs(f.My) / both->MNy, z = std::fabs(f.Mz) / both->MNz;
-    constexpr double kNothing = 1e-9;
-    const double bent =
-        sheet.Put("bending", std::min(y, z) <= kNothing ? std::max(y, z) : both->ratio,
-                  "EN 1993-1-1 6.2.9.1", "M/MN about one axis, else the sum", K);
-    if (bent >= alone) check.clause.fill("EN 1993-1-1 6.2.9.1");
-    check.at.fill(T_CHECK{std::max(bent, alone), 1.0});
+    if (both->ratio >= alone) check.clause.fill("EN 1993-1-1 6.2.9.1");
+    check.at.fill(T_CHECK{std::max(both->ratio, alone), 1.0});
     return true;
 }
 
