@@ -67,15 +67,15 @@ T_END_CHECKS Checked(const T_JUDGED_END& end, double N, double V, double chord)
 } // namespace
 
 // N = 300. Annex C: 83.8 in flexure, V = 0.065 fm/CF 0.4 3 (1 - 3 V/300) = 208/3.08 in sliding,
-// which comes first: drift 0.004. NTC: Mu/h0 = 83.5 comes first: 3/4 of 0.01; sliding 520/0.7 0.4 3
-// (1 - 3 V/300) = 891.4286/9.914286.
+// which comes first: drift 0.004. NTC: Mu/h0 = 83.5 comes first: 3/4 of 0.01; sliding 520/(0.7 1.2)
+// 0.4 3 (1 - 3 V/300) = 742.857143/8.428571.
 TEST(JudgedMaterials, PiersByTheDriftOfTheModeThatComesFirst)
 {
     const struct {
         HINGE_CODE code;
         double drift, shear;
     } kCases[] = {{HINGE_CODE::En1998, 0.004, 208.0 / 3.08},
-                  {HINGE_CODE::Circolare2019, 0.0075, 891.4285714 / 9.914285714}};
+                  {HINGE_CODE::Circolare2019, 0.0075, 742.8571429 / 8.428571429}};
     for (const auto& c : kCases) {
         const T_JUDGED_END end = Pier(c.code);
         const T_END_CHECKS checks = Checked(end, 300.0 * kN, 80.0 * kN, -0.003);
