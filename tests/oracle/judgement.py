@@ -60,11 +60,11 @@ def asce17():
 
 
 def joint(cf, gamma_c):
-    """Exterior joint without hoops: bj = 0.40, hc = 0.40, N = 640."""
-    fc, area = 28.0 / cf / gamma_c, 0.16
-    eta, nu = 0.6 * (1 - fc / 250), N / 1000 / (area * fc)
+    """Exterior joint without hoops: bj = 0.40, hc = 0.40, bars 0.306 apart, N = 640."""
+    fc, area, between = 28.0 / cf / gamma_c, 0.16, 0.4 * 0.306
+    eta, nu = 0.6 * (1 - 28.0 / cf / 250), N / 1000 / (area * fc)
     psi = 0.006894757293168
-    print("joint", dict(lever=0.9 * 0.453, en=0.8 * eta * fc * math.sqrt(1 - nu / eta) * area * 1000,
+    print("joint", dict(lever=0.9 * 0.453, en=0.8 * eta * fc * math.sqrt(1 - nu / eta) * between * 1000,
                         circolare_tension=0.3 * math.sqrt(fc) * 1000, circolare_compression=0.5 * fc * 1000,
                         asce_kappa=0.9 * 6 * math.sqrt(20.0 / psi) * psi * area * 1000))
 

@@ -79,18 +79,22 @@ std::optional<T_ACI_SHEAR> AciShear(const T_SHEAR_SECTION& s, double lambda, CCo
     const double area = s.bw * s.d;
     const double axial = std::min(s.axial / (6.0 * s.Ag), 0.05 * s.fc);
     T_ACI_SHEAR v;
-    if (s.legArea > 0.0) {
-        v.concrete = sheet.Put("Vc", std::max(0.0, (2.0 * lambda * root + axial) * area), kDimForce,
-                               kAci, "(2 lambda sqrt(f'c) + Nu/(6 Ag)) bw d (psi)", R);
+    const double least = std::max(0.75 * root, 50.0 * kPascalsPerPsi); // 9.6.3.4, Av,min fyt/(bw s)
+    const bool hooped = s.legArea > 0.0;
+    const bool enough = hooped && s.legArea * s.fyw >= least * s.bw * s.spacing;
+    const double size = std::min(1.0, std::sqrt(2.0 / (1.0 + s.d / kMetresPerInch / 10.0)));
+    const double stress =
+        (enough ? 2.0 : 8.0 * size * std::cbrt(s.tensionRatio)) * lambda * root + axial;
+    v.concrete =
+        sheet.Put("Vc", std::clamp(stress, 0.0, 5.0 * lambda * root) * area, kDimForce, kAci,
+                  enough ? "(2 lambda sqrt(f'c) + Nu/(6 Ag)) bw d <= 5 lambda sqrt(f'c) "
+                           "bw d (psi)"
+                         : "Av < Av,min: (8 l_s lambda rho^(1/3) sqrt(f'c) + Nu/(6 Ag)) "
+                           "bw d <= 5 lambda sqrt(f'c) bw d (psi)",
+                  R);
+    if (hooped)
         v.hoops = sheet.Put("Vs", std::min(s.legArea * s.fyw * s.d / s.spacing, 8.0 * root * area),
                             kDimForce, kAci, "Av fyt d/s <= 8 sqrt(f'c) bw d (psi)", R);
-    } else {
-        const double size = std::min(1.0, std::sqrt(2.0 / (1.0 + s.d / kMetresPerInch / 10.0)));
-        const double stress = 8.0 * size * lambda * std::cbrt(s.tensionRatio) * root + axial;
-        v.concrete =
-            sheet.Put("Vc", std::clamp(stress, 0.0, 5.0 * lambda * root) * area, kDimForce, kAci,
-                      "(8 l_s lambda rho^(1/3) sqrt(f'c) + Nu/(6 Ag)) bw d (psi)", R);
-    }
     v.Vn = sheet.Put("Vn", v.concrete + v.hoops, kDimForce, kAci, "Vc + Vs", R);
     return sheet.Sound() ? std::optional(v) : std::nullopt;
 }

@@ -30,8 +30,8 @@ std::optional<T_EN_SHEAR> EnShear(const T_SHEAR_SECTION& s, const T_EN_SHEAR_OPT
 struct T_ACI_SHEAR {
     double concrete = 0.0, hoops = 0.0, Vn = 0.0;
 };
-/// ACI 318 22.5, normal weight: lambda = 1, else 0.75. With hoops or not: 318-19 takes the size
-/// effect into Vc where there are none.
+/// ACI 318-19 Table 22.5.5.1, normal weight: lambda = 1, else 0.75. Vc has the size effect where
+/// there are no hoops, or less than 9.6.3.4 asks for; at most 5 lambda sqrt(f'c) bw d.
 std::optional<T_ACI_SHEAR> AciShear(const T_SHEAR_SECTION& s, double lambda, CCodeSheet& sheet);
 
 /// ACI 318 18.10.4.1, slender walls (hw / lw >= 2): Vn = (2 sqrt(f'c) + rho_t fyt) Acv in psi, not

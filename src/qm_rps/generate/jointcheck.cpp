@@ -92,15 +92,25 @@ JOINT_KIND KindOf(const T_MEETING& m)
     return transverse ? JOINT_KIND::ExteriorWithBeams : JOINT_KIND::Exterior;
 }
 
-/// Upright local z is the element's own vector, else global X.
-double DepthAlong(const T_ELEM_D& e, const T_SECT_D& s, std::size_t along)
+/// The horizontal axis is local z of the column, else y. Upright local z is the element's own
+/// vector, else global X.
+bool IsAlongZ(const T_ELEM_D& e, std::size_t along)
 {
     const bool own = e.zAxis != T_VECTOR{};
     const double z = own ? e.zAxis[along] : (along == 0 ? 1.0 : 0.0);
     const double size =
         own ? std::sqrt(std::inner_product(e.zAxis.begin(), e.zAxis.end(), e.zAxis.begin(), 0.0))
             : 1.0;
-    return std::fabs(z) > kAlong * size ? s.size[0] : s.size[1];
+    return std::fabs(z) > kAlong * size;
+}
+
+/// Between the outermost bars; 0: there are no two.
+double BetweenBars(const T_SECT_D& section, bool alongZ)
+{
+    const auto place = alongZ ? &T_REBAR::z : &T_REBAR::y;
+    if (section.bars.empty()) return 0.0;
+    const auto [low, high] = std::ranges::minmax_element(section.bars, {}, place);
+    return (*high).*place - (*low).*place;
 }
 
 /// Width that carries shear: ACI 318 15.4.2.4 or EN 1998-1 5.5.3.3(2).
@@ -110,7 +120,7 @@ double WidthOf(HINGE_CODE code, double column, double beam, double hc)
     return column > beam ? std::min(column, beam + 0.5 * hc) : std::min(beam, column + 0.5 * hc);
 }
 
-/// EN 1998-1 5.5.3.3(2): diagonal compression, without partial factors.
+/// EN 1998-1 5.5.3.3(2): diagonal compression over the depth between the outermost bars.
 std::optional<double> EnJointStrength(const T_JOINT& j, double axial, CCodeSheet& sheet)
 {
     constexpr const char* kClause = "EN 1998-1 5.5.3.3";
@@ -118,12 +128,12 @@ std::optional<double> EnJointStrength(const T_JOINT& j, double axial, CCodeSheet
     const double eta = sheet.Put("eta", 0.6 * (1.0 - j.fc / kPascalsPerMpa / 250.0), kClause,
                                  "0.6 (1 - fc/250)", R);
     const double nu =
-        sheet.Put("nu_d", std::max(0.0, axial) / (j.columnArea * j.fc), kClause, "N/(Ac fc)", R);
+        sheet.Put("nu_d", std::max(0.0, axial) / (j.columnArea * j.fcd), kClause, "N/(Ac fcd)", R);
     if (!sheet.Positive({{"eta", eta}}) || !sheet.Within("axial", nu, 0.0, eta)) return {};
     const bool interior = j.kind == JOINT_KIND::Interior || j.kind == JOINT_KIND::InteriorWithBeams;
     const double share = sheet.Put("share", interior ? 1.0 : 0.8, kClause, "exterior 0.8", R);
-    return sheet.Put("Vj,R", share * eta * j.fc * std::sqrt(1.0 - nu / eta) * j.width * j.hc,
-                     kDimForce, kClause, "eta fc sqrt(1 - nu_d/eta) bj hc", R);
+    return sheet.Put("Vj,R", share * eta * j.fcd * std::sqrt(1.0 - nu / eta) * j.width * j.hjc,
+                     kDimForce, kClause, "eta fcd sqrt(1 - nu_d/eta) bj hjc", R);
 }
 
 bool Asce(const T_JOINT& j, const T_JOINT_DEMAND& d, T_JOINT_CHECK& out, CCodeSheet& sheet)
@@ -147,7 +157,7 @@ bool Asce(const T_JOINT& j, const T_JOINT_DEMAND& d, T_JOINT_CHECK& out, CCodeSh
 
 bool Circolare(const T_JOINT& j, const T_JOINT_DEMAND& d, T_JOINT_CHECK& out, CCodeSheet& sheet)
 {
-    const auto s = CircolareJoint(d.axial, out.shear, j.width * j.hc, j.fc, sheet);
+    const auto s = CircolareJoint(d.axial, out.shear, j.width * j.hjc, j.fcd, sheet);
     if (!s) return false;
     const bool tension = s->tension / s->tensionLimit > s->compression / s->compressionLimit;
     out.demand = tension ? s->tension : s->compression;
@@ -202,10 +212,12 @@ int ReadJoint(const T_MODEL& model, std::span<const int> around, int node, std::
     j.column = column;
     j.beams = beams;
     j.kind = KindOf(m);
-    j.fc = material->fc;
+    j.fc = j.fcd = material->fc;
     j.lower = post.material->fck > 0.0 ? post.material->fck : material->fc;
     j.columnArea = post.section->size[0] * post.section->size[1];
-    j.hc = DepthAlong(model.elements.at(column), *post.section, along);
+    const bool alongZ = IsAlongZ(model.elements.at(column), along);
+    j.hc = post.section->size[alongZ ? 0 : 1];
+    j.hjc = BetweenBars(*post.section, alongZ);
     double widest = 0.0;
     for (const int beam : beams) {
         const T_PART part = PartOf(model, beam);
@@ -235,7 +247,10 @@ int CheckJoint(const T_JOINT& joint, const T_JOINT_DEMAND& demand, T_JOINT_CHECK
     if (!sheet.Finite({{"axial", demand.axial}})) return Fail(reason, ReasonOf(sheet));
     T_JOINT_CHECK check;
     sheet.Put("z", joint.lever, kDimLength, "", "0.9 d of the beams", K);
-    sheet.Put("bj hc", joint.width * joint.hc, T_DIM{0, 2}, "", "", K);
+    const bool bars = IsChordCode(joint.code);
+    if (bars) sheet.Positive({{"hjc", joint.hjc}});
+    sheet.Put(bars ? "bj hjc" : "bj hc", joint.width * (bars ? joint.hjc : joint.hc), T_DIM{0, 2},
+              "", bars ? "hjc: between the outermost bars of the column" : "", K);
     sheet.Put("N", demand.axial, kDimForce, "", "of the column above", K);
     check.shear = sheet.Put("Vj", std::fabs(demand.beamMoments / joint.lever - demand.columnShear),
                             kDimForce, "", "sum M/z - V of the column", K);

@@ -14,9 +14,11 @@ struct T_JOINT {
     std::vector<int> beams;   // elements in the plane, one or two
     JOINT_KIND kind = JOINT_KIND::Interior;
     double hc = 0.0, width = 0.0; // depth of the column along the beams; of the joint across
+    double hjc = 0.0;             // between the outermost bars of the column along the beams
     double columnArea = 0.0;      // Ag
     double lever = 0.0;           // of the beams' bars, 0.9 d of the shallower one
     double fc = 0.0;              // assessed: expected (ASCE 41), mean over the confidence factor
+    double fcd = 0.0;             // the same over gamma_C where the check asks for it
     double lower = 0.0;           // lower bound (ASCE 41)
     std::vector<T_CODE_TRACE> trace; // of the strengths
 };

@@ -20,8 +20,8 @@ void Reduce(T_JOINT& joint, double gammaC)
     CCodeSheet sheet;
     const char* const clause =
         joint.code == HINGE_CODE::En1998 ? "EN 1998-3 2.2.1" : "Circolare 2019 C8.7.2.3.5";
-    joint.fc = sheet.Put("fc", joint.fc / gammaC, kDimStress, clause,
-                         "mean.fc/(CF " + CodeNumber(gammaC) + ")", R);
+    joint.fcd = sheet.Put("fcd", joint.fc / gammaC, kDimStress, clause,
+                          "mean.fc/(CF " + CodeNumber(gammaC) + ")", R);
     joint.trace.insert(joint.trace.end(), sheet.Trace().begin(), sheet.Trace().end());
 }
 

@@ -135,6 +135,10 @@ TEST(CodeConcrete, ShearAndTwoMoments)
         12 * in, 20 * in,        264 * in * in, 4000 * kPascalsPerPsi, 60 * kPascalsPerKsi, 0.01,
         0.0,     0.22 * in * in, 10 * in};
     ExpectRel(56757.9 * lb, AciShear(aci, 1.0, sheet)->Vn, 1e-6, "ACI");
+    aci.axial = 9e5 * lb; // N/6Ag = 568 psi, at most 0.05 f'c = 200: 326.5 psi, more than 5 63.2456
+    ExpectRel((75894.7 + 26400) * lb, AciShear(aci, 1.0, sheet)->Vn, 1e-6, "ACI, 5 sqrt(f'c)");
+    aci.axial = 0.0, aci.legArea = 0.09 * in * in; // 50 x 12 x 10/60000 = 0.1 in2 are the least
+    ExpectRel((21360.6 + 10800) * lb, AciShear(aci, 1.0, sheet)->Vn, 1e-4, "ACI, few hoops");
     aci.legArea = 0.0;
     ExpectRel(21360.6 * lb, AciShear(aci, 1.0, sheet)->Vn, 1e-4, "ACI, no hoops");
 

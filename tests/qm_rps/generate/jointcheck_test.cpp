@@ -61,18 +61,18 @@ TEST(JointCheck, ByEachCode)
     // Vj = 343.302 / (0.9 x 0.453) - 100 = 742.045; joint 0.40 x 0.40, N = 640.
     const T_JOINT_DEMAND demand{343.302e3, 100e3, 640e3};
     const double shear = 343.302e3 / (0.9 * 0.453) - 100e3;
-    // Principal stresses: 2000 kPa and 742.045/0.16.
-    const double radius = std::hypot(2e6, shear / 0.16);
+    // Principal stresses over 0.40 m by the 0.306 m between the bars: 320 and 742.045/0.1224.
+    const double pressed = 320e3 / 0.1224, radius = std::hypot(pressed, shear / 0.1224);
     const struct {
         HINGE_CODE code;
         double demand, capacity;
     } cases[] = {
         // 10 sqrt(20 MPa in psi) 0.16 m2: no hoops, no transverse beams.
         {HINGE_CODE::Asce17, shear, 10 * std::sqrt(20e6 * 6894.757293168) * 0.16},
-        // 0.6 (1 - 23.333/250) 23.333 sqrt(1 - 0.171429/0.544) 0.16
+        // 0.6 (1 - 23.333/250) 23.333 sqrt(1 - 0.171429/0.544) 0.1224
         {HINGE_CODE::En1998, shear,
-         0.544 * 28e6 / 1.2 * std::sqrt(1 - 640e3 / 0.16 / (28e6 / 1.2) / 0.544) * 0.16},
-        {HINGE_CODE::Circolare2019, radius - 2e6, 0.3e6 * std::sqrt(28 / 1.2)},
+         0.544 * 28e6 / 1.2 * std::sqrt(1 - 640e3 / 0.16 / (28e6 / 1.2) / 0.544) * 0.1224},
+        {HINGE_CODE::Circolare2019, radius - pressed, 0.3e6 * std::sqrt(28 / 1.2)},
     };
     for (const auto& c : cases) {
         T_JOINT joint;
