@@ -100,9 +100,15 @@ struct T_CODE_SIDE {
 inline double ShearOf(const T_MEMBER_END& end, double capacity, CCodeSheet& sheet)
 {
     constexpr auto K = CODE_MARK::Computed;
+    const bool ofState = end.shearSpan > 0.0;
     sheet.Put("LV", end.ShearSpan(), kDimLength, "",
-              end.pushed ? "M/V of the push" : "clear length/2", K);
-    return sheet.Put(
-        "V", end.pushed ? end.pushed->shear : capacity, kDimForce, "",
-        end.pushed ? "of the push, where the hinge yields" : "(My(+) + My(-))/clear length", K);
+              ofState      ? "M/V of the state"
+              : end.pushed ? "M/V of the push"
+                           : "clear length/2",
+              K);
+    return sheet.Put("V", end.pushed ? end.pushed->shear : capacity, kDimForce, "",
+                     !end.pushed ? "(My(+) + My(-))/clear length"
+                     : ofState   ? "of the state"
+                                 : "of the push, where the hinge yields",
+                     K);
 }

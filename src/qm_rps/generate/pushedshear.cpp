@@ -60,7 +60,9 @@ std::map<int, std::vector<double>> PushedShears(const std::vector<T_PUSH_RUN>& r
                     double* const place = &values[4 * axis + (atI ? 0 : 2)];
                     if (!(v > place[0])) continue;
                     place[0] = v;
-                    place[1] = span;
+                    // The loads along a beam are not in its end moments: with them M / V is less.
+                    place[1] =
+                        member.kind == MEMBER_KIND::Beam ? std::min(span, member.clear / 2) : span;
                 }
             }
         if (std::ranges::any_of(values, [](double v) { return v > 0.0; }))

@@ -188,6 +188,7 @@ void PlasticRotations(const T_CHECKING& c, double axial)
     CCodeSheet span, sheet;
     T_MEMBER_END member = ShearEnd(c.end, c.state, span);
     member.axial = axial;
+    if (const double V = std::fabs(c.state.V); V > 0.0) member.pushed = {V, member.ShearSpan()};
     const auto side = GeneratedSide(member, IsPositiveSide(c.end, c.state), check.why);
     if (!side) return;
     check.trace = side->trace;

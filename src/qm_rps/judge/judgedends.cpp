@@ -95,6 +95,7 @@ public:
         m_first = m_out.size();
         m_any = {};
         m_tie = 0.0;
+        m_connection = {};
         m_any.place.element = id;
         const std::size_t up = VerticalAxis(m_model);
         const int other = element.kind == ELEM_KIND::Spring ? element.nodeI : element.nodeJ;
@@ -107,6 +108,7 @@ public:
         std::optional<HINGE_CODE> code = m_options.code;
         bool secondary = m_options.secondary;
         const T_PHGT_D* const type = m_lookup.GeneratedType(id);
+        if (type) m_connection = type->generated->connection;
         if (!code && type) {
             code = HingeCodeNamed(type->generated->code);
             secondary = type->generated->secondary;
@@ -137,8 +139,9 @@ private:
                     end.why = Say("IDS_QM_PUSH_HINGE_RELEASED");
                 } else {
                     end.basis = JUDGE_BASIS::Code;
-                    end.member =
-                        EndOf(m_model, member, {code, secondary, m_tie}, component, !atJ, 0.0);
+                    T_CODE_OPTIONS options{code, secondary, m_tie};
+                    if (code == HINGE_CODE::Asce17) options.connection = m_connection;
+                    end.member = EndOf(m_model, member, options, component, !atJ, 0.0);
                     end.shearHinge =
                         m_lookup.Hinge(m_any.place.element,
                                        component == HINGE_COMPONENT::My ? HINGE_COMPONENT::Fz
@@ -240,8 +243,9 @@ private:
     const T_JUDGE_OPTIONS& m_options;
     std::vector<T_JUDGED_END>& m_out;
     std::size_t m_first = 0;
-    T_JUDGED_END m_any; // what the ends of the element share
-    double m_tie = 0.0; // of spandrels, as their hinges were generated
+    T_JUDGED_END m_any;                             // what the ends of the element share
+    double m_tie = 0.0;                             // of spandrels, as their hinges were generated
+    std::optional<T_STEEL_CONNECTION> m_connection; // of beams, as their hinges were generated
 };
 
 /// The joints of frames: where a column and a beam meet, but for those of masonry and on the

@@ -29,6 +29,7 @@ std::optional<double> ShearStrength(const T_JUDGED_END& end, CCodeSheet& sheet, 
 {
     T_MEMBER_END member = end.member;
     member.kind = MEMBER_KIND::Beam;
+    member.connection = {}; // it says nothing of the web
     T_MATL_D& m = member.material;
     const bool chord = IsChordCode(member.code);
     if (!chord && m.Fy > 0.0) {
@@ -194,7 +195,10 @@ bool CountsOnNoRotation(const T_CHECKING& c)
 void CheckRotation(const T_CHECKING& c)
 {
     if (IsChordCode(c.end.By())) return GeneratedChord(c);
-    const bool ofGravity = c.end.By() == HINGE_CODE::Asce17 && c.end.member.HasAxial();
+    // Table 9-7.1 and AISC 342 C3.6 count P of the gravity loads.
+    const bool ofGravity =
+        (c.end.By() == HINGE_CODE::Asce17 || c.end.By() == HINGE_CODE::Aisc342) &&
+        c.end.member.HasAxial();
     if (ofGravity && !c.with.gravity) {
         c.Of(Rotation).why = Say("IDS_QM_JUDGE_NO_GRAVITY");
         return;
