@@ -1,6 +1,7 @@
 #include "qm_rps/judge/judgement.h"
 
 #include "qm_base/say.h"
+#include "qm_rps/generate/steeljoint.h"
 #include "qm_rps/push/pushstoreys.h"
 
 #include <algorithm>
@@ -130,6 +131,9 @@ private:
         T_HINGE_MEMBER member;
         if (!ReadMember(m_model, m_any.place.element, CInitialAxial(), member, m_any.why)) return;
         if (member.kind == MEMBER_KIND::Brace) return AddBrace(true, code, secondary);
+        if (code == HINGE_CODE::Asce17 && m_connection &&
+            !ReadSteelJoints(m_model, *m_connection, member, m_any.why))
+            return;
         m_any.column = IsUpright(member.kind);
         for (const HINGE_COMPONENT component : member.bending)
             for (const bool atJ : {false, true}) {
