@@ -75,7 +75,7 @@ void EraseOld(CDBDoc& doc, const std::set<int>& elements, CEditScope& edit)
         (void)edit.Erase<T_PHGT_D>(key);
 }
 
-/// V that the hinges were made with, as PushedShears has it (M / V stays 0).
+/// V that the hinges were made with, as CPushedShears has it (M / V stays 0).
 std::map<int, std::vector<double>> ShearsOf(const T_CODE_HINGES& hinges)
 {
     std::map<int, std::vector<double>> out;
@@ -239,16 +239,19 @@ int CCodeHinges::GenerateFromPush(T_CODE_REQUEST request, int loadCase, T_CODE_H
     std::vector<T_CODE_ITERATION> iterations;
     if (!Generate(request, made, refusal)) return 0;
     while (iterations.size() < kMostPushes) {
-        std::vector<T_PUSH_RUN> runs;
-        std::string error;
-        if (!CPushRun(m_doc).Run(loadCase, {}, runs, error)) {
-            refusal = RefusalOf(0, error);
-            return 0;
-        }
         std::vector<T_HINGE_MEMBER> members;
         for (const T_CODE_ELEMENT& element : made.elements)
             members.push_back(element.member);
-        auto now = PushedShears(runs, members);
+        CPushedShears shears(members);
+        std::vector<T_PUSH_RUN> runs;
+        std::string error;
+        CPushRun push(m_doc);
+        push.TellForces([&shears](const T_STEP_FORCES& step) { shears.Take(step); });
+        if (!push.Run(loadCase, {}, runs, error)) {
+            refusal = RefusalOf(0, error);
+            return 0;
+        }
+        auto now = shears.Values();
         iterations.push_back({LargestChange(ShearsOf(made), now), runs.front().outcome});
         request.pushed = std::move(now);
         if (request.pushed.empty()) break;

@@ -59,7 +59,7 @@ public:
     [[nodiscard]] int Generate(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
                                T_HINGE_REFUSAL& refusal);
 
-    /// Generates, pushes a load case and generates again with the shear of the push (PushedShears)
+    /// Generates, pushes a load case and generates again with the shear of the push (CPushedShears)
     /// until no V changes by kSameShear of itself, at most kMostPushes times; each push is told.
     /// What the push could not settle is said as a warning. 1 done; 0 with the refusal, also where
     /// the load case can't be pushed, the document unchanged.

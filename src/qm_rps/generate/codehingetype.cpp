@@ -125,6 +125,21 @@ void AddShear(const T_CODE_COMPONENT& bending, T_CODE_HINGE& hinge)
     hinge.components.push_back(std::move(shear));
 }
 
+/// V of a push in one direction is small at the end that the loads along the member relieve.
+void WarnRelieved(const T_HINGE_MEMBER& member, T_CODE_HINGE& hinge)
+{
+    constexpr double kMuchLess = 0.75; // of the other end's V
+    if (member.HasAxial()) return;
+    for (std::size_t at = 0; at + 3 < member.pushed.size(); at += 4) {
+        const double I = member.pushed[at], J = member.pushed[at + 2];
+        const double less = std::min(I, J), more = std::max(I, J);
+        if (less > 0.0 && less < kMuchLess * more)
+            hinge.warnings.push_back({"IDS_QM_GEN_WARN_RELIEVED",
+                                      {I < J ? "I" : "J", CodeNumber(less / 1000.0),
+                                       CodeNumber(more / 1000.0)}});
+    }
+}
+
 /// What the hinges of a member are made for.
 struct T_TASK {
     const T_MODEL& model;
@@ -332,6 +347,7 @@ int MakeCodeHinge(const T_MODEL& model, const T_HINGE_MEMBER& member, const T_CO
             type.element = HINGE_ELEMENT::Truss;
     } else {
         if (!Bend(task, hinge, reason)) return 0;
+        WarnRelieved(member, hinge);
         if (member.HasAxial() && type.material != MATL_CLASS::Masonry && options.axialRange.empty())
             PutAxialCurve(task, hinge);
     }

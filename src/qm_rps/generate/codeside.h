@@ -4,7 +4,9 @@
 #include "qm_rps/codes/asce41connection.h"
 #include "qm_rps/codes/codebackbone.h"
 
+#include <algorithm>
 #include <array>
+#include <limits>
 #include <vector>
 
 /// Aisc342: columns of steel alone.
@@ -39,9 +41,9 @@ inline bool IsUpright(MEMBER_KIND kind)
     return kind == MEMBER_KIND::Column || kind == MEMBER_KIND::Wall || kind == MEMBER_KIND::Pier;
 }
 
-/// Of a stored push, at the step at which the hinge yields.
+/// Of a push, at the step at which the hinge yields.
 struct T_PUSHED_SHEAR {
-    double shear = 0.0, shearSpan = 0.0; // V; M / V
+    double shear = 0.0, shearSpan = 0.0; // V; M / V within LeastSpan and LongestSpan
 };
 
 /// What a hinge stands on.
@@ -71,6 +73,21 @@ struct T_MEMBER_END {
         return pushed ? pushed->shearSpan : clear / 2.0;
     }
     bool HasAxial() const { return IsUpright(kind); }
+    /// Along the shear force.
+    double Depth() const
+    {
+        const bool round =
+            section.shape == SECT_SHAPE::Circle || section.shape == SECT_SHAPE::Pipe;
+        return section.size[aboutY || round ? 0 : 1];
+    }
+    /// A point without a moment close to the end does not make a member squat.
+    double LeastSpan() const { return std::min(Depth(), clear / 2.0); }
+    /// Where the loads along a beam take its shear away, M / V says nothing of its chord; a wall
+    /// goes on over several storeys.
+    double LongestSpan() const
+    {
+        return HasAxial() ? std::numeric_limits<double>::infinity() : clear;
+    }
     /// Rotation of an end at a moment, with the same moment at the other: what bends elastically
     /// lies between the rigid offsets.
     double Turn(double moment) const { return moment * clear / (6.0 * EI); }
@@ -103,7 +120,7 @@ inline double ShearOf(const T_MEMBER_END& end, double capacity, CCodeSheet& shee
     const bool ofState = end.shearSpan > 0.0;
     sheet.Put("LV", end.ShearSpan(), kDimLength, "",
               ofState      ? "M/V of the state"
-              : end.pushed ? "M/V of the push"
+              : end.pushed ? "M/V of the push, at least min(h; clear length/2)"
                            : "clear length/2",
               K);
     return sheet.Put("V", end.pushed ? end.pushed->shear : capacity, kDimForce, "",

@@ -41,11 +41,6 @@ std::optional<T_MASONRY> MasonryOf(const T_MEMBER_END& end, CCodeSheet& sheet)
     return out;
 }
 
-double DepthOf(const T_MEMBER_END& end)
-{
-    return end.section.size[end.aboutY ? 0 : 1];
-}
-
 /// SLC, with 3/4 of it for SLV; SLD is yield.
 T_CHORD_LIMITS NtcLimits(double drift, CCodeSheet& sheet)
 {
@@ -63,7 +58,7 @@ std::optional<T_STRENGTHS> SpandrelOf(const T_MEMBER_END& end, const T_MASONRY& 
         return {};
     }
     T_SPANDREL s;
-    s.depth = DepthOf(end);
+    s.depth = end.Depth();
     s.thickness = end.section.size[end.aboutY ? 1 : 0];
     s.length = end.clear;
     s.tie = end.tie;
@@ -80,7 +75,7 @@ std::optional<T_STRENGTHS> SpandrelOf(const T_MEMBER_END& end, const T_MASONRY& 
 std::optional<T_STRENGTHS> PierOf(const T_MEMBER_END& end, const T_MASONRY& m, CCodeSheet& sheet)
 {
     T_PIER p;
-    p.length = DepthOf(end);
+    p.length = end.Depth();
     p.thickness = end.section.size[end.aboutY ? 1 : 0];
     p.height = end.clear;
     p.shearSpan = end.ShearSpan();
@@ -156,7 +151,7 @@ int MasonryHinge(const T_MEMBER_END& end, T_SIDES<T_CODE_SIDE>& out, std::string
     side.strength = side.strengthAtZero = strengths->moment;
     side.shearStrength = strengths->shear;
     side.shear = ShearOf(end, 2.0 * side.strength / end.clear, sheet);
-    side.hingeLength = DepthOf(end);
+    side.hingeLength = end.Depth();
     const double turn = sheet.Put("theta_y", end.Turn(side.strength), "",
                                   "Mu L/(6 EI), EI of the model, clear length", K);
     const double sway = sheet.Put("Delta_y", end.Sway(strengths->shear), kDimLength, "",

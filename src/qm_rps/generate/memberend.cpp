@@ -15,7 +15,7 @@ using T_VECTOR = std::array<double, 3>;
 constexpr double kSameAxial = 1e-6; // of the squash load
 /// Of the rules by which hinges are made, raised where a rule changes what comes out: a type of an
 /// earlier edition is stale, not edited.
-constexpr double kEdition = 2.0;
+constexpr double kEdition = 3.0;
 constexpr auto kMy = HINGE_COMPONENT::My, kMz = HINGE_COMPONENT::Mz;
 
 double Dot(const T_VECTOR& a, const T_VECTOR& b)
@@ -214,7 +214,9 @@ T_MEMBER_END EndOf(const T_MODEL& model, const T_HINGE_MEMBER& member,
     const auto axis = std::ranges::find(member.bending, component) - member.bending.begin();
     const std::size_t place = 4 * static_cast<std::size_t>(axis) + (atI ? 0 : 2);
     if (place + 1 < member.pushed.size() && member.pushed[place] > 0.0)
-        end.pushed = T_PUSHED_SHEAR{member.pushed[place], member.pushed[place + 1]};
+        end.pushed = T_PUSHED_SHEAR{
+            member.pushed[place],
+            std::clamp(member.pushed[place + 1], end.LeastSpan(), end.LongestSpan())};
     return end;
 }
 

@@ -3,70 +3,67 @@
 #include <algorithm>
 #include <cmath>
 
-namespace {
-
-/// Moments of one end over the steps; null: it has no hinge about this axis.
-const T_PUSH_HINGE_SERIES* SeriesOf(const T_PUSH_RUN& run, int element, HINGE_COMPONENT component,
-                                    const char* end)
+CPushedShears::CPushedShears(const std::vector<T_HINGE_MEMBER>& members)
 {
-    const auto found = std::ranges::find_if(run.hinges, [&](const T_PUSH_HINGE_SERIES& h) {
-        return h.place.element == element && h.place.component == component && h.place.end == end;
-    });
-    return found == run.hinges.end() ? nullptr : &*found;
-}
-
-double MomentAt(const T_PUSH_HINGE_SERIES* series, std::size_t step)
-{
-    return series ? series->force[step] : 0.0; // an end without a hinge is released
-}
-
-/// V and M / V of an end; V 0: there is none.
-std::array<double, 2> OfEnd(const T_PUSH_HINGE_SERIES* own, const T_PUSH_HINGE_SERIES* other,
-                            double clear)
-{
-    if (!own || own->force.empty()) return {};
-    const auto shear = [&](std::size_t step) {
-        return std::fabs(MomentAt(own, step) - MomentAt(other, step)) / clear;
-    };
-    std::size_t at = 0;
-    for (std::size_t i = 0; i < own->force.size(); ++i) {
-        if (own->state[i] != PUSH_STATE::Elastic) {
-            at = i;
-            break;
-        }
-        if (shear(i) > shear(at)) at = i;
+    for (const T_HINGE_MEMBER& member : members) {
+        m_sizes[member.element] = 4 * member.bending.size();
+        for (std::size_t axis = 0; axis < member.bending.size(); ++axis)
+            for (const bool atJ : {false, true}) {
+                T_END& end = m_ends.emplace_back();
+                end.place = {member.element, atJ, member.bending[axis]};
+                end.value = 4 * axis + (atJ ? 2 : 0);
+            }
     }
-    const double v = shear(at);
-    constexpr double kNothing = 1e-9; // of the moment over the length
-    const double moment = std::fabs(MomentAt(own, at));
-    if (!(v > kNothing * moment / clear) || !(moment > 0.0)) return {};
-    return {v, moment / v};
 }
 
-} // namespace
+void CPushedShears::Begin(const T_PUSH_RUN& run)
+{
+    for (T_END& end : m_ends) {
+        end.V = end.M = 0.0;
+        end.flows = false;
+        const char* const at = end.place.atJ ? "J" : "I";
+        const auto hinge = std::ranges::find_if(run.hinges, [&](const T_PUSH_HINGE_SERIES& h) {
+            return h.place.element == end.place.element &&
+                   h.place.component == end.place.component && h.place.end == at;
+        });
+        end.hinge = hinge == run.hinges.end() ? nullptr : &*hinge;
+    }
+}
 
-std::map<int, std::vector<double>> PushedShears(const std::vector<T_PUSH_RUN>& runs,
-                                                const std::vector<T_HINGE_MEMBER>& members)
+void CPushedShears::TakeEnd(const T_STEP_FORCES& step, T_END& end)
+{
+    constexpr double kNothing = 1e-9; // 1/m: what rounding leaves of the shear of a moment
+    if (!end.hinge || end.flows) return;
+    const T_END_FORCES forces = EndForces(end.place, step);
+    const double V = std::fabs(forces.V), M = std::fabs(forces.M);
+    end.flows = end.hinge->state[step.step] != PUSH_STATE::Elastic;
+    if (!end.flows && V <= end.V) return;
+    end.V = V > kNothing * M ? V : 0.0;
+    end.M = M;
+}
+
+void CPushedShears::Take(const T_STEP_FORCES& step)
+{
+    if (step.step == 0) Begin(step.run);
+    for (T_END& end : m_ends)
+        TakeEnd(step, end);
+    if (step.step + 1 < step.run.displacement.size()) return;
+    for (T_END& end : m_ends) {
+        if (!(end.V > end.largest) || !(end.M > 0.0)) continue;
+        end.largest = end.V;
+        end.span = end.M / end.V;
+    }
+}
+
+std::map<int, std::vector<double>> CPushedShears::Values() const
 {
     std::map<int, std::vector<double>> out;
-    for (const T_HINGE_MEMBER& member : members) {
-        std::vector<double> values(4 * member.bending.size());
-        for (const T_PUSH_RUN& run : runs)
-            for (std::size_t axis = 0; axis < member.bending.size(); ++axis) {
-                const auto* i = SeriesOf(run, member.element, member.bending[axis], "I");
-                const auto* j = SeriesOf(run, member.element, member.bending[axis], "J");
-                for (const bool atI : {true, false}) {
-                    const auto [v, span] = OfEnd(atI ? i : j, atI ? j : i, member.clear);
-                    double* const place = &values[4 * axis + (atI ? 0 : 2)];
-                    if (!(v > place[0])) continue;
-                    place[0] = v;
-                    // The loads along a beam are not in its end moments: with them M / V is less.
-                    place[1] =
-                        member.kind == MEMBER_KIND::Beam ? std::min(span, member.clear / 2) : span;
-                }
-            }
-        if (std::ranges::any_of(values, [](double v) { return v > 0.0; }))
-            out.emplace(member.element, std::move(values));
+    for (const T_END& end : m_ends) {
+        if (!(end.largest > 0.0)) continue;
+        std::vector<double>& values =
+            out.try_emplace(end.place.element, m_sizes.at(end.place.element)).first->second;
+        values[end.value] = end.largest;
+        values[end.value + 1] = end.span;
     }
     return out;
 }

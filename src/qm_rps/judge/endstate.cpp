@@ -76,36 +76,24 @@ std::optional<T_MEMBER_AXES> AxesOf(const T_MODEL& model, const T_ELEM_D& e)
 
 T_END_STATE Between(const T_END_STATE& a, const T_END_STATE& b, double at)
 {
+    using S = T_END_STATE;
+    constexpr std::array<double S::*, 7> kMembers{&S::N,     &S::M,      &S::V,          &S::across,
+                                                  &S::chord, &S::flowed, &S::hingeMoment};
     T_END_STATE s;
-    for (double T_END_STATE::*m :
-         {&T_END_STATE::N, &T_END_STATE::M, &T_END_STATE::V, &T_END_STATE::across,
-          &T_END_STATE::chord, &T_END_STATE::flowed, &T_END_STATE::hingeMoment})
+    for (double S::*m : kMembers)
         s.*m = a.*m + at * (b.*m - a.*m);
     return s;
-}
-
-const solver::T_VEC6& ForcesAt(int element, bool atJ, const T_STEP_FORCES& step)
-{
-    const auto at = std::ranges::lower_bound(step.elements, element);
-    const auto& forces = step.result.force[static_cast<std::size_t>(at - step.elements.begin())];
-    return atJ ? forces.back() : forces.front();
 }
 
 T_END_STATE EndState(const T_END_PLACE& place, const T_MEMBER_AXES& axes, long hinge,
                      const T_STEP_FORCES& step)
 {
-    T_END_STATE s;
-    const solver::T_VEC6& end = ForcesAt(place.element, place.atJ, step);
-    s.N = -end[0];
+    T_END_STATE s{EndForces(place, step)};
     if (place.component == HINGE_COMPONENT::Fx) {
         s.chord = Dot(MovedApart(axes, MoveOf(step.run.data, step.step, axes.nodeI),
                                  MoveOf(step.run.data, step.step, axes.nodeJ)),
                       axes.x);
     } else {
-        const bool aboutY = place.component == HINGE_COMPONENT::My;
-        s.M = end[aboutY ? 4 : 5];
-        s.across = end[aboutY ? 5 : 4];
-        s.V = end[aboutY ? 2 : 1];
         s.chord = ChordRotation(place, axes, step.run.data, step.step);
     }
     if (hinge < 0) return s;

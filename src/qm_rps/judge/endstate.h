@@ -1,7 +1,7 @@
 // Forces and rotations of member ends in the steps of a push. SI.
 #pragma once
 
-#include "qm_rps/push/pushrun.h"
+#include "qm_rps/push/endforces.h"
 
 /// A beam element: flexible length between its rigid offsets, local axes.
 struct T_MEMBER_AXES {
@@ -13,19 +13,8 @@ struct T_MEMBER_AXES {
 /// Nothing where the offsets leave no length.
 std::optional<T_MEMBER_AXES> AxesOf(const T_MODEL& model, const T_ELEM_D& element);
 
-/// Which end of which element, bent about which of its axes; of a brace Fx, which is of both ends.
-struct T_END_PLACE {
-    int element = 0;
-    bool atJ = false;
-    HINGE_COMPONENT component = HINGE_COMPONENT::My; // Mz, Fx
-    bool operator==(const T_END_PLACE&) const = default;
-};
-
-/// Forces with the signs of an analysis but for the axial force.
-struct T_END_STATE {
-    double N = 0.0; // compression positive
-    double M = 0.0, V = 0.0;
-    double across = 0.0; // moment about the other axis
+/// Forces and deformations of an end.
+struct T_END_STATE : T_END_FORCES {
     double chord = 0.0;  // rotation of the end, that of its hinge included, less that of the chord;
                          // of a brace its elongation
     double flowed = 0.0; // deformation of the hinge at the end, 0 without one
@@ -33,9 +22,6 @@ struct T_END_STATE {
 };
 /// On the straight line from a (0) to b (1); beyond them too.
 T_END_STATE Between(const T_END_STATE& a, const T_END_STATE& b, double at);
-
-/// Axial force, shears, torsion and moments of an end in a step, with the signs of an analysis.
-const solver::T_VEC6& ForcesAt(int element, bool atJ, const T_STEP_FORCES& step);
 
 /// The state of an end in a step. `hinge`: its component among those of the run; -1: none.
 T_END_STATE EndState(const T_END_PLACE& place, const T_MEMBER_AXES& axes, long hinge,

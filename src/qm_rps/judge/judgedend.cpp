@@ -16,16 +16,7 @@ namespace {
 constexpr auto K = CODE_MARK::Computed;
 constexpr auto R = CODE_MARK::Recalled;
 
-/// Along the shear force.
-double DepthOf(const T_MEMBER_END& member)
-{
-    const T_SECT_D& s = member.section;
-    const bool round = s.shape == SECT_SHAPE::Circle || s.shape == SECT_SHAPE::Pipe;
-    return s.size[member.aboutY || round ? 0 : 1];
-}
-
-/// M / V of a state on the sheet. A point without a moment close to the end does not make a member
-/// squat: at least the depth, or half the clear length where that is shorter. An end without forces
+/// M / V of a state on the sheet, at least LeastSpan. An end without forces
 /// (its hinge has lost them) has what hinges are generated with.
 double SpanOf(const T_MEMBER_END& member, const T_END_STATE& s, double longest, const char* beyond,
               CCodeSheet& sheet)
@@ -33,9 +24,9 @@ double SpanOf(const T_MEMBER_END& member, const T_END_STATE& s, double longest, 
     constexpr double kNothing = 1e-9; // of the depth squared times the strength: rounding
     const T_MATL_D& m = member.material;
     const T_MATL_MEAN mean = m.mean.value_or(T_MATL_MEAN{});
-    const double M = std::fabs(s.M), V = std::fabs(s.V), depth = DepthOf(member);
+    const double M = std::fabs(s.M), V = std::fabs(s.V), depth = member.Depth();
     const double force = kNothing * depth * depth * std::max({m.fck, mean.fc, m.Fy});
-    const double least = std::min(depth, member.clear / 2.0);
+    const double least = member.LeastSpan();
     const auto put = [&](double span, const char* text) {
         return sheet.Put("LV", span, kDimLength, "", text, K);
     };
