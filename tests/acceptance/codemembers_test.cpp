@@ -301,6 +301,33 @@ TEST_F(CodeMembers, CurvesByAxialForceAreThoseAtTheirForces)
                         3, "at N = ");
 }
 
+TEST_F(CodeMembers, EditsOfWhatATypeWasAskedForAreTold)
+{
+    Write("f.json", Frame().dump(1));
+    (void)Done("hinge generate f.json --code ASCE41-17 --elements 4 --connection RBS -o g.json"
+               " --overwrite");
+    const json made = json::parse(Text("g.json"));
+    const json& generated = made.at("hinge_types").at(0).at("generated");
+    const struct {
+        const char *place, *value;
+        bool edited;
+    } kEdits[] = {
+        {"code", "\"ASCE41-17\"", false},       {"code", "\"ASCE41-13\"", true}, // the same row
+        {"secondary", "true", true},            {"axial_I", "5", true},
+        {"tie", "5", true},                     {"axial_range", "[0, 5]", true},
+        {"connection/kind", "\"WUF-B\"", true}, {"connection/panel_ratio", "0.75", true},
+    };
+    for (const auto& e : kEdits) {
+        json file = made;
+        file[json::json_pointer("/hinge_types/0/generated/" + std::string(e.place))] =
+            json::parse(e.value);
+        Write("e.json", file.dump(1));
+        const std::string said = Done("hinge check e.json");
+        EXPECT_EQ(e.edited, said.find("generated, and edited since") != std::string::npos)
+            << e.place << " of " << generated << "\n" << said;
+    }
+}
+
 // By hand from the end moments of the push, at the first step where the end flows: V = (MI - MJ)/L
 // of column 2 (no load along it), -+ w L/2 of beam 11 under w = 32.6 kN/m between the rigid offsets;
 // M/V within min(0.5; 2.3) and, of the beam, 4.6 m.

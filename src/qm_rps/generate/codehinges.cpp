@@ -329,9 +329,11 @@ CODE_TYPE_STATE CCodeHinges::StateOf(int hingeType, std::string& text)
             return notChecked(Say("IDS_QM_GEN_NOT_CHECKED",
                                   Say("IDS_QM_HINGE_ELEMENT", std::to_string(id), reason)));
         member.pushed = type.generated->pushed;
-        if (SameInputs(type.generated->inputs, InputsOf(model, member))) continue;
-        text = Say("IDS_QM_GEN_STALE", std::to_string(id));
-        return CODE_TYPE_STATE::Stale;
+        const INPUT_STATE state = InputStateOf(*type.generated, InputsOf(model, member));
+        if (state == INPUT_STATE::Same) continue;
+        const bool isStale = state == INPUT_STATE::Stale;
+        text = isStale ? Say("IDS_QM_GEN_STALE", std::to_string(id)) : Say("IDS_QM_GEN_EDITED");
+        return isStale ? CODE_TYPE_STATE::Stale : CODE_TYPE_STATE::Edited;
     }
     text.clear();
     if (member.element == 0) return CODE_TYPE_STATE::Fresh; // no element has it

@@ -360,6 +360,7 @@ int MakeCodeHinge(const T_MODEL& model, const T_HINGE_MEMBER& member, const T_CO
                                  options.axialRange,
                                  options.tie,
                                  member.joints ? options.connection : std::nullopt};
+    PutSeal(*type.generated);
     out = std::move(hinge);
     return 1;
 }

@@ -16,6 +16,7 @@ constexpr double kSameAxial = 1e-6; // of the squash load
 /// Of the rules by which hinges are made, raised where a rule changes what comes out: a type of an
 /// earlier edition is stale, not edited.
 constexpr double kEdition = 3.0;
+constexpr std::size_t kPlaceOfEdition = 2; // among the inputs, behind the axial forces
 constexpr auto kMy = HINGE_COMPONENT::My, kMz = HINGE_COMPONENT::Mz;
 
 double Dot(const T_VECTOR& a, const T_VECTOR& b)
@@ -146,6 +147,40 @@ void AppendSection(const T_SECT_D& s, std::vector<double>& to)
         Append(to, {bar.y, bar.z, bar.area});
 }
 
+/// The first ones are axial forces over the squash load.
+bool SameNumbers(const std::vector<double>& a, const std::vector<double>& b, std::size_t forces)
+{
+    constexpr double kDigits = 1e-9; // a file in other units gives back this much
+    if (a.size() != b.size()) return false;
+    for (std::size_t i = 0; i < a.size(); ++i) {
+        const double most =
+            i < forces ? kSameAxial : kDigits * std::max(std::fabs(a[i]), std::fabs(b[i]));
+        if (!(std::fabs(a[i] - b[i]) <= most)) return false;
+    }
+    return true;
+}
+
+/// What a type was asked for with, as numbers; names by their place in the list of names.
+std::vector<double> SealOf(const T_GENERATED& made)
+{
+    const auto placeIn = [](const auto& names, const std::string& name) {
+        return static_cast<double>(std::ranges::find(names, name) - names.begin());
+    };
+    const T_STEEL_CONNECTION c = made.connection.value_or(T_STEEL_CONNECTION{});
+    const std::vector<double>& range = made.axialRange;
+    return {placeIn(kHingeCodeNames, made.code),
+            made.secondary ? 1.0 : 0.0,
+            made.axial.I,
+            made.axial.J,
+            made.tie,
+            range.empty() ? 0.0 : range.front(),
+            range.empty() ? 0.0 : range.back(),
+            made.connection ? 1.0 + placeIn(kFrConnectionNames, c.kind) : 0.0,
+            c.columnFlange,
+            c.continuityPlate,
+            c.panelRatio};
+}
+
 } // namespace
 
 int ReadMember(const T_MODEL& model, int element, const CInitialAxial& axial, T_HINGE_MEMBER& out,
@@ -245,15 +280,26 @@ std::vector<double> InputsOf(const T_MODEL& model, const T_HINGE_MEMBER& member)
     return inputs;
 }
 
+void PutSeal(T_GENERATED& made)
+{
+    const std::vector<double> seal = SealOf(made);
+    made.inputs.insert(made.inputs.end(), seal.begin(), seal.end());
+}
+
+INPUT_STATE InputStateOf(const T_GENERATED& made, const std::vector<double>& today)
+{
+    const std::vector<double> seal = SealOf(made);
+    const auto count = static_cast<std::ptrdiff_t>(seal.size());
+    const std::vector<double>& all = made.inputs;
+    // Those of an earlier edition have another seal, or none.
+    if (all.size() < kPlaceOfEdition + 1 + seal.size() || all[kPlaceOfEdition] != kEdition)
+        return INPUT_STATE::Stale;
+    if (!SameNumbers({all.end() - count, all.end()}, seal, 0)) return INPUT_STATE::Edited;
+    return SameInputs({all.begin(), all.end() - count}, today) ? INPUT_STATE::Same
+                                                               : INPUT_STATE::Stale;
+}
+
 bool SameInputs(const std::vector<double>& a, const std::vector<double>& b)
 {
-    constexpr double kDigits = 1e-9; // a file in other units gives back this much
-    constexpr std::size_t kForces = 2;
-    if (a.size() != b.size()) return false;
-    for (std::size_t i = 0; i < a.size(); ++i) {
-        const double most =
-            i < kForces ? kSameAxial : kDigits * std::max(std::fabs(a[i]), std::fabs(b[i]));
-        if (!(std::fabs(a[i] - b[i]) <= most)) return false;
-    }
-    return true;
+    return SameNumbers(a, b, kPlaceOfEdition);
 }

@@ -40,3 +40,11 @@ T_MEMBER_END EndOf(const T_MODEL& model, const T_HINGE_MEMBER& member,
 std::vector<double> InputsOf(const T_MODEL& model, const T_HINGE_MEMBER& member);
 /// Equal but for rounding; axial forces to 1e-6 of the squash load.
 bool SameInputs(const std::vector<double>& a, const std::vector<double>& b);
+
+/// Ends the inputs of a generated type with what it was asked for with, as the record has it: code,
+/// level, axial forces, connection.
+void PutSeal(T_GENERATED& made);
+/// How the inputs that a generated type has stand to those of the model today.
+enum class INPUT_STATE { Same, Stale, Edited };
+/// Edited: the record is not what it was sealed with.
+INPUT_STATE InputStateOf(const T_GENERATED& made, const std::vector<double>& today);
