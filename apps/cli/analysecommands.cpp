@@ -5,6 +5,7 @@
 #include "output.h"
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
+#include "qm_db/sectionstiffness.h"
 #include "qm_rps/desk/elementlist.h"
 #include "json/analysisjson.h"
 
@@ -201,6 +202,8 @@ EXIT_CODE Analyse(CDBDoc& doc, const std::vector<int>& cases, int modes, bool no
     if (doc.RunAnalysis(options, error)) {
         for (const T_LOST_DIGITS& lost : doc.LostDigits())
             std::fprintf(stderr, "%s: %s\n", doc.Path().c_str(), doc.TextOf(lost).c_str());
+        if (const std::string text = StiffnessFactorText(doc.Data().Model()); !text.empty())
+            std::fprintf(stderr, "%s: %s\n", doc.Path().c_str(), text.c_str());
         return EXIT_CODE::Done;
     }
     return Complain(ExitCodeOf(error), doc.Path() + ": " + error.text);

@@ -171,6 +171,8 @@ const char* MessageKeyOf(SECT_FAULT fault)
         return "IDS_QM_SECT_DIMENSIONS";
     case SECT_FAULT::Values:
         return "IDS_QM_SECT_VALUES";
+    case SECT_FAULT::Factors:
+        return "IDS_QM_SECT_FACTORS";
     case SECT_FAULT::Material:
         return "IDS_QM_SECT_MATERIAL";
     case SECT_FAULT::Class:

@@ -10,6 +10,7 @@ enum class SECT_FAULT {
     None,
     Dimensions,    // a dimension is not above 0 or not finite, or the walls leave no hollow
     Values,        // an entered property is negative or not finite
+    Factors,       // a stiffness factor is not above 0 or not finite
     Material,      // a strength or modulus is not above 0 or not finite
     Class,         // no method for this material class
     Shape,         // no method for this shape in this material

@@ -3,6 +3,7 @@
 #include "qm_base/messagehistory.h"
 #include "qm_base/msgfunction.h"
 #include "qm_db/filectrl.h"
+#include "qm_db/sectionstiffness.h"
 
 #include <filesystem>
 #include <memory>
@@ -247,6 +248,8 @@ int CMainFrame::OnAnalyse(int modes, std::function<bool(std::size_t, std::size_t
     }
     for (const T_LOST_DIGITS& lost : m_doc.LostDigits())
         GSaveHistoryFormatNF("%s", m_doc.TextOf(lost).c_str());
+    if (const std::string text = StiffnessFactorText(m_doc.Data().Model()); !text.empty())
+        GSaveHistoryFormatNF("%s", text.c_str());
     Note("IDS_QM_UI_ANALYSED", NameOfFile(m_doc.Path()));
     return 1;
 }

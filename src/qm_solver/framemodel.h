@@ -5,6 +5,7 @@
 
 #include <array>
 #include <cstddef>
+#include <optional>
 #include <vector>
 
 namespace solver {
@@ -32,6 +33,10 @@ struct T_MATERIAL {
 struct T_SECTION {
     double A = 0.0, Asy = 0.0, Asz = 0.0;
     double J = 0.0, Iy = 0.0, Iz = 0.0;
+    /// Area of the axial stiffness where that is not A, which mass and weight have.
+    std::optional<double> stiffA{};
+
+    double StiffA() const { return stiffA.value_or(A); }
 };
 
 enum class ELEMENT_KIND {

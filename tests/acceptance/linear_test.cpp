@@ -187,6 +187,36 @@ TEST_F(Linear, PictureOfTheDeformedShapeStatesItsScale)
 }
 #endif
 
+// By hand: L 2 m, mean Iy factor 0.4, area factor 0.5: UZ = 12 L3/(3 E 0.4 Iy), UX = 100 L/(E 0.5 A);
+// warmed by 50 degrees alpha 50 L whatever EA is; weight density g A L of the whole area.
+TEST_F(Linear, StiffnessFactorsOfSectionsCountAndNotInTheWeight)
+{
+    json file = json::parse(R"({"format": "qm-rps case 1",
+        "units": {"force": "kN", "length": "m"}, "plane": "XZ",
+        "nodes": [{"id": 1, "xyz": [0, 0, 0], "restraint": [1, 1, 1, 1, 1, 1]},
+                  {"id": 2, "xyz": [2, 0, 0]}],
+        "materials": [{"name": "S", "E": 200e6, "nu": 0.3, "density": 7.85, "alpha": 1.2e-5}],
+        "sections": [{"name": "cracked", "A": 0.02, "Iy": 8e-5, "Iz": 4e-5, "J": 1e-5,
+                      "factors_I": {"area": 0.5, "Iyy": 0.3},
+                      "factors_J": {"area": 0.5, "Iyy": 0.5}}],
+        "elements": [{"id": 1, "nodes": [1, 2], "material": "S", "section": "cracked"}],
+        "load_cases": [{"name": "P", "nodal": [{"node": 2, "load": [100, 0, -12, 0, 0, 0]}]},
+                       {"name": "T", "temperature": [{"element": 1, "change": 50}]},
+                       {"name": "W", "self_weight": [0, 0, -1]}]})");
+    Write("c.json", file.dump(1));
+    const json r = Json("analyse c.json");
+    const json& moved = r.at("displacements").at("P").at("2");
+    EXPECT_NEAR(-0.005, moved[2], 1e-12);
+    EXPECT_NEAR(1e-4, moved[0], 1e-14);
+    EXPECT_NEAR(1.2e-3, r["displacements"]["T"]["2"][0], 1e-13);
+    EXPECT_NEAR(7.85 * 9.80665 * 0.02 * 2, r["reactions"]["W"]["1"][2], 1e-9);
+    ExpectHolds(Run("analyse c.json").text,
+                {"cracked: area 0.5, Iyy 0.4 (0.3 at I, 0.5 at J)"});
+    file["sections"][0]["factors_J"]["Iyy"] = 0;
+    Write("c.json", file.dump(1));
+    (void)ExpectRefused("analyse c.json", 3, "stiffness factor");
+}
+
 TEST_F(Linear, BadModelsAreRefusedWithTheReason)
 {
     const struct {

@@ -1,7 +1,7 @@
 #include "qm_db/analysis/analysismodel.h"
 
 #include "qm_base/say.h"
-#include "qm_db/sectionproperties.h"
+#include "qm_db/sectionstiffness.h"
 
 #include <algorithm>
 
@@ -84,16 +84,17 @@ solver::T_NODE NodeOf(const T_NODE_D& record, const solver::T_DIRS6& outOfPlane)
 
 solver::T_MATERIAL MaterialOf(const T_MATL_D& m)
 {
-    return {m.E, m.G.value_or(m.E / (2.0 * (1.0 + m.nu))), m.density, m.alpha};
+    return {m.E, ShearModulus(m), m.density, m.alpha};
 }
 
 /// Of a shape with dimensions, what follows from these; zero for a section that is wrong.
 solver::T_SECTION SectionOf(const T_SECT_D& record)
 {
-    T_SECT_D s;
+    T_SECT_D s, stiff;
     SECT_FAULT fault{};
-    if (!CSectionProperties::Calc(record, s, fault)) return {};
-    return {s.area, s.Asy, s.Asz, s.J, s.Iyy, s.Izz};
+    if (!CSectionProperties::Calc(record, s, fault) || !CalcStiffness(record, stiff, fault))
+        return {};
+    return {s.area, stiff.Asy, stiff.Asz, stiff.J, stiff.Iyy, stiff.Izz, stiff.area};
 }
 
 /// What is wrong with a section, empty for nothing.
@@ -101,7 +102,7 @@ std::string SectionFault(const T_SECT_D& record)
 {
     T_SECT_D ignored;
     SECT_FAULT fault{};
-    if (CSectionProperties::Calc(record, ignored, fault)) return {};
+    if (CalcStiffness(record, ignored, fault)) return {};
     return Say("IDS_QM_ANALYSIS_SECTION", record.name, Say(MessageKeyOf(fault)));
 }
 

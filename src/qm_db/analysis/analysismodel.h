@@ -16,7 +16,8 @@ public:
 
     /// Translates the structure. A plane model is restrained out of its plane at every node; G that
     /// is not given is E / (2 (1 + nu)); gravity that is not given is 9.80665 m/s2. Stiffness
-    /// factors of sections do not count. 1 done; 0 error filled: an element lacks its node, section
+    /// factors of sections count with the mean of both ends, mass and weight have the whole area.
+    /// 1 done; 0 error filled: an element lacks its node, section
     /// or material. What the engine checks itself is left to it.
     [[nodiscard]] int BuildFrame(T_ANALYSIS_ERROR& error);
     const solver::T_FRAME& Frame() const { return m_frame; }

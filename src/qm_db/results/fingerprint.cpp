@@ -53,6 +53,10 @@ private:
     void Add(const T_SECT_D& s)
     {
         (*this)(s.shape, s.size, s.area, s.Asy, s.Asz, s.J, s.Iyy, s.Izz);
+        // Only where they are there: results of other models that are stored stay fresh.
+        if (s.fillet != 0.0) Add(s.fillet);
+        for (const T_SECT_FACTORS& f : {s.factorsI, s.factorsJ})
+            if (f != T_SECT_FACTORS{}) (*this)(f.area, f.Asy, f.Asz, f.J, f.Iyy, f.Izz);
     }
     void Add(const T_ELEM_D& e)
     {

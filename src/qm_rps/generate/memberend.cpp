@@ -1,7 +1,7 @@
 #include "qm_rps/generate/memberend.h"
 
 #include "qm_base/say.h"
-#include "qm_db/sectionproperties.h"
+#include "qm_db/sectionstiffness.h"
 #include "qm_rps/generate/rcmember.h"
 #include "qm_rps/push/pushstoreys.h"
 
@@ -113,11 +113,6 @@ double SquashLoad(const T_SECT_D& section, const T_MATL_D& material)
                                                         : std::max(material.fck, mean.fc));
 }
 
-double ShearModulus(const T_MATL_D& m)
-{
-    return m.G.value_or(m.E / (2.0 * (1.0 + m.nu)));
-}
-
 void Append(std::vector<double>& to, std::initializer_list<double> values)
 {
     to.insert(to.end(), values);
@@ -141,6 +136,8 @@ void AppendSection(const T_SECT_D& s, std::vector<double>& to)
     Append(to, {s.size[0], s.size[1], d.cover, d.stirrupDiameter, d.stirrupSpacing, d.lapLength});
     Append(to, {1.0 * d.legsY, 1.0 * d.legsZ, 1.0 * static_cast<int>(d.hooks),
                 d.tiesInCore ? 1.0 : 0.0, d.poorSplice ? 1.0 : 0.0});
+    const T_SECT_FACTORS f = MeanFactors(s);
+    Append(to, {f.area, f.Asy, f.Asz, f.J, f.Iyy, f.Izz});
     if (s.shape != SECT_SHAPE::Rectangle)
         Append(to, {1.0 * static_cast<int>(s.shape), s.size[2], s.size[3], s.fillet});
     for (const T_REBAR& bar : s.bars)
@@ -239,9 +236,11 @@ T_MEMBER_END EndOf(const T_MODEL& model, const T_HINGE_MEMBER& member,
     end.clear = member.clear;
     end.axial = axial;
     const T_MATL_D& m = end.material;
-    end.EI = m.E * (end.aboutY ? end.section.Iyy : end.section.Izz);
-    end.EA = m.E * end.section.area;
-    end.GA = ShearModulus(m) * (end.aboutY ? end.section.Asz : end.section.Asy);
+    T_SECT_D stiff = end.section; // as the analysis has it
+    (void)CalcStiffness(end.section, stiff, fault);
+    end.EI = m.E * (end.aboutY ? stiff.Iyy : stiff.Izz);
+    end.EA = m.E * stiff.area;
+    end.GA = ShearModulus(m) * (end.aboutY ? stiff.Asz : stiff.Asy);
     if (member.joints) {
         end.connection = options.connection;
         end.joint = atI ? member.joints->I : member.joints->J;

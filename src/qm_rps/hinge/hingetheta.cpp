@@ -73,7 +73,7 @@ std::optional<double> CHingeTheta::CalcStiffness(const T_THETA_LOOKUP& lookup,
     T_BASIS b;
     if (!ReadBasis(lookup, end, b)) return std::nullopt;
     const double E = lookup.material->E, L = lookup.perLength ? 1.0 : lookup.memberLength;
-    const double G = E / (2.0 * (1.0 + lookup.material->nu));
+    const double G = ShearModulus(*lookup.material);
     const bool shear = option == INIT_STIFFNESS::Elastic, elastic = shear && !lookup.perLength;
     const double n = lookup.perLength ? 1.0 : RotationFactor(option);
     switch (component) {

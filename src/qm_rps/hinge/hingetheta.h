@@ -37,7 +37,7 @@ public:
                                   double yieldMoment);
 
     /// Fy or Fz. K = the user stiffness, or (option Elastic) G times the shear area of that
-    /// direction and its factor of that end, G = E / (2 (1 + nu)).
+    /// direction and its factor of that end, G as the material has it.
     static double CalcThetaShear(const T_THETA_LOOKUP& lookup, HINGE_COMPONENT component,
                                  HINGE_LOCATION end, INIT_STIFFNESS option, double userStiffness,
                                  double yieldForce);

@@ -2,6 +2,7 @@
 
 #include "qm_base/say.h"
 #include "qm_db/recordfacts.h"
+#include "qm_db/sectionstiffness.h"
 #include "qm_rps/push/loadalgebra.h"
 #include "qm_rps/push/pushcollector.h"
 #include "qm_rps/push/pushwarnings.h"
@@ -225,7 +226,7 @@ int CPushRun::Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_
     if (!PrepareCases(key, cases, on, error)) return 0;
     const auto warnings = StopWarnings(m_model.pushovers.at(key).stops,
                                        !StoreysOf(m_model, m_frame, 0).empty(), on->hinges.laws);
-    const std::string elastic = NoHingeText(m_model);
+    const std::string elastic = NoHingeText(m_model), factors = StiffnessFactorText(m_model);
     std::vector<T_PUSH_RUN> runs;
     for (T_PUSH_CASE& c : cases) {
         std::vector<double>& steps = c.stages.back().additional;
@@ -235,7 +236,8 @@ int CPushRun::Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_
             error = Say("IDS_QM_PUSH_CASE_QUOTED", m_model.pushovers.at(key).name) + ": " + error;
             return 0;
         }
-        if (!elastic.empty()) runs.back().warnings.push_back(elastic);
+        for (const std::string& text : {elastic, factors})
+            if (!text.empty()) runs.back().warnings.push_back(text);
         for (const T_FINDING& warning : warnings)
             runs.back().warnings.push_back(warning.field + ": " + warning.text);
         if (runs.back().cancelled) break;

@@ -43,7 +43,7 @@ struct T_PUSH_RUN {
     std::size_t direction = 0; // 0 to 5
     PUSH_STATUS status = PUSH_STATUS::Failed;
     std::string outcome, advice;
-    std::vector<std::string> warnings; // of a run: no hinge acts, stops that could not act
+    std::vector<std::string> warnings; // of a run: no hinge acts, stiffness factors, stops
     bool cancelled = false;
     double startDisplacement = 0.0;      // of the control node, before the first step
     std::optional<double> startReaction; // then; empty: the state before is not known

@@ -80,7 +80,8 @@ T_SOLVER_REASON SectionFault(const T_FRAME& frame, const T_ELEMENT& element)
     if (!(std::isfinite(m.E) && m.E > 0.0)) return "IDS_QM_ENGINE_MODULUS_E";
     if (!NotNegative(std::array{m.G, m.density})) return "IDS_QM_ENGINE_MODULUS_G";
     if (!std::isfinite(m.alpha)) return "IDS_QM_ENGINE_EXPANSION";
-    if (!(std::isfinite(s.A) && s.A > 0.0)) return "IDS_QM_ENGINE_AREA";
+    for (const double area : {s.A, s.StiffA()})
+        if (!(std::isfinite(area) && area > 0.0)) return "IDS_QM_ENGINE_AREA";
     if (!NotNegative(std::array{s.Asy, s.Asz})) return "IDS_QM_ENGINE_SHEAR_AREA";
     if (!NotNegative(std::array{s.J, s.Iy, s.Iz})) return "IDS_QM_ENGINE_INERTIA";
     if (element.kind == ELEMENT_KIND::Beam && m.G == 0.0 && (s.J > 0.0 || s.Asy + s.Asz > 0.0))

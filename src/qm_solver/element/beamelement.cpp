@@ -90,7 +90,7 @@ void CBeamElement::MakeLocalStiffness(const T_MATERIAL& material, const T_SECTIO
     const double L = m_shape.length, E = material.E, G = material.G;
     m_shape.phiY = ShearParameter(E * section.Iz, G * section.Asy, L);
     m_shape.phiZ = ShearParameter(E * section.Iy, G * section.Asz, L);
-    PutPair(m_local, 0, 6, E * section.A / L);
+    PutPair(m_local, 0, 6, E * section.StiffA() / L);
     PutPair(m_local, 3, 9, G * section.J / L);
     PutBending(m_local, {1, 5, 7, 11}, 1.0, E * section.Iz, m_shape.phiY, L);
     PutBending(m_local, {2, 4, 8, 10}, -1.0, E * section.Iy, m_shape.phiZ, L);

@@ -33,7 +33,7 @@ T_VEC3 TrussDirection(const T_FRAME& frame, const T_ELEMENT& element, double& le
 
 double TrussStiffness(const T_FRAME& frame, const T_ELEMENT& element, double length)
 {
-    return frame.materials[element.material].E * frame.sections[element.section].A / length;
+    return frame.materials[element.material].E * frame.sections[element.section].StiffA() / length;
 }
 
 void ElementStiffness(const T_FRAME& frame, const T_ELEMENT& element, const T_AXIAL& axial,

@@ -87,7 +87,7 @@ void CCaseLoads::AddStrains(const T_FRAME& frame, const T_LOAD_CASE& load)
         const T_ELEMENT& element = frame.elements[t.element];
         const T_MATERIAL& material = frame.materials[element.material];
         m_axial[t.element] -=
-            material.E * frame.sections[element.section].A * material.alpha * t.change;
+            material.E * frame.sections[element.section].StiffA() * material.alpha * t.change;
     }
 }
 

@@ -154,6 +154,25 @@ TEST(MemberBasis, WhatBendsLiesBetweenTheRigidOffsets)
     EXPECT_NEAR(1 + 0.03 * (bone.C.deform / bone.yieldDeform - 1), bone.C.strength, 1e-9);
 }
 
+TEST(MemberBasis, StiffnessIsThatOfTheAnalysisAndStrengthThatOfTheSection)
+{
+    T_MODEL model = Column();
+    const auto end = [&model] {
+        return EndOf(model, Read(model), {HINGE_CODE::Asce17}, HINGE_COMPONENT::My, true, 0.0);
+    };
+    const T_MEMBER_END whole = end();
+    T_SECT_D& section = model.sections[1];
+    section.factorsI.Iyy = 0.3, section.factorsJ.Iyy = 0.5; // 0.4 on the mean
+    section.factorsI.Asz = section.factorsJ.Asz = 0.2;
+    section.factorsI.area = section.factorsJ.area = 0.6;
+    const T_MEMBER_END cracked = end();
+    EXPECT_NEAR(0.4 * whole.EI, cracked.EI, 1e-9 * whole.EI);
+    EXPECT_NEAR(0.2 * whole.GA, cracked.GA, 1e-9 * whole.GA);
+    EXPECT_NEAR(0.6 * whole.EA, cracked.EA, 1e-9 * whole.EA);
+    EXPECT_EQ(whole.section.area, cracked.section.area);
+    EXPECT_NEAR(whole.Turn(1.0) / 0.4, cracked.Turn(1.0), 1e-9 * cracked.Turn(1.0));
+}
+
 TEST(MemberBasis, AllThatGoesIntoATypeIsAmongItsInputs)
 {
     const T_MODEL model = Column();
@@ -167,6 +186,7 @@ TEST(MemberBasis, AllThatGoesIntoATypeIsAmongItsInputs)
         {"G", [](T_MODEL& m) { m.materials[1].G = 70e9; }, true},
         {"nu", [](T_MODEL& m) { m.materials[1].nu = 0.2; }, true},
         {"G that nu gives", [](T_MODEL& m) { m.materials[1].G = 210e9 / 2.6; }, false},
+        {"factor", [](T_MODEL& m) { m.sections[1].factorsJ.Izz = 0.5; }, true},
         {"density", [](T_MODEL& m) { m.materials[1].density = 7850; }, false},
     };
     for (const auto& c : cases) {

@@ -3,6 +3,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_db/recordfacts.h"
+#include "qm_db/sectionstiffness.h"
 #include "qm_rps/pushover/adrsformulas.h"
 #include "qm_rps/pushover/evaluation/missedvertex.h"
 
@@ -36,6 +37,7 @@ public:
     void OnFigures();
     void OnParticipation();
     void OnSteps();
+    void OnStiffness();
 
 private:
     void Say(const char* key, std::initializer_list<std::string_view> values)
@@ -232,6 +234,15 @@ void CRemarks::OnSteps()
          Number(V)});
 }
 
+/// Of a push of our own: another solver has its own stiffness.
+void CRemarks::OnStiffness()
+{
+    const auto push = FindPush(m_doc.Data().Model(), m_result.eval.push);
+    if (!push || !m_doc.Post().RunOf(push->key, push->turn)) return;
+    const std::string text = StiffnessFactorText(m_doc.Data().Model());
+    if (!text.empty()) m_result.messages.push_back({"IDS_QM_FACTORS_COUNT", text});
+}
+
 } // namespace
 
 void AddRemarks(CDBDoc& doc, const T_SPFC_D& spectrum, T_PUSH_EVALUATION& result)
@@ -244,4 +255,5 @@ void AddRemarks(CDBDoc& doc, const T_SPFC_D& spectrum, T_PUSH_EVALUATION& result
     remarks.OnFigures();
     remarks.OnParticipation();
     remarks.OnSteps();
+    remarks.OnStiffness();
 }
