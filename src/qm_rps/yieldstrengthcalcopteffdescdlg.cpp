@@ -59,15 +59,15 @@ CYieldStrengthCalcOptEffDescDlg::CYieldStrengthCalcOptEffDescDlg(CDBDoc& doc,
 
 std::vector<std::string> CYieldStrengthCalcOptEffDescDlg::Heads() const
 {
-    std::vector<std::string> heads{HingeHead("IDS_QM_UI_HEAD_ELEMENT", kDimNone, m_units),
-                                   HingeHead("IDS_CMD_IEHP_SECT_TXT", kDimNone, m_units)};
+    std::vector<std::string> heads{HeadWithUnit("IDS_QM_UI_HEAD_ELEMENT", kDimNone, m_units),
+                                   HeadWithUnit("IDS_CMD_IEHP_SECT_TXT", kDimNone, m_units)};
     for (const char* end : {", I", ", J"})
         for (const T_PROPERTY& p : kProperties)
-            heads.push_back(HingeHead(std::string(p.symbol) + end, p.dim, m_units));
+            heads.push_back(HeadWithUnit(std::string(p.symbol) + end, p.dim, m_units));
     for (const char* symbol : {"Zy", "Zz"})
-        heads.push_back(HingeHead(symbol, {0, 3}, m_units));
+        heads.push_back(HeadWithUnit(symbol, {0, 3}, m_units));
     for (const char* symbol : {"Avy", "Avz"})
-        heads.push_back(HingeHead(symbol, {0, 2}, m_units));
+        heads.push_back(HeadWithUnit(symbol, {0, 2}, m_units));
     return heads;
 }
 

@@ -34,10 +34,10 @@ CYieldStrengthCalcOptMatDescDlg::CYieldStrengthCalcOptMatDescDlg(CDBDoc& doc,
 
 std::vector<std::string> CYieldStrengthCalcOptMatDescDlg::Heads() const
 {
-    std::vector<std::string> heads{HingeHead("IDS_QM_UI_HEAD_ELEMENT", kDimNone, m_units),
-                                   HingeHead("IDS_QM_UI_HINGE_MATERIAL", kDimNone, m_units)};
+    std::vector<std::string> heads{HeadWithUnit("IDS_QM_UI_HEAD_ELEMENT", kDimNone, m_units),
+                                   HeadWithUnit("IDS_QM_UI_HINGE_MATERIAL", kDimNone, m_units)};
     for (const char* symbol : {"Fy", "fck", "fyk", "E", "Es"})
-        heads.push_back(HingeHead(symbol, kDimStress, m_units));
+        heads.push_back(HeadWithUnit(symbol, kDimStress, m_units));
     for (const char* symbol : {"n", "eps_c2", "eps_cu2"})
         heads.push_back(symbol);
     return heads;

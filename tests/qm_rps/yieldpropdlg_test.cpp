@@ -1,4 +1,5 @@
 #include "numbers.h"
+#include "qm_rps/dialog/unithead.h"
 #include "qm_rps/po_hingeyieldpropdlgnew.h"
 #include "qm_rps/po_hingeyieldpropgrid.h"
 #include "qm_rps/yieldstrengthcalcoptdlg.h"
@@ -152,4 +153,13 @@ TEST(YieldStrengthCalcOpt, RefusesASelectionOfAnotherKind)
     EXPECT_EQ(selected, dlg.Data());
     EXPECT_EQ(1, dlg.OnSelectElemChk(false, {{2, HINGE_ELEMENT::Wall}}));
     EXPECT_EQ(T_YIELD_CALC_OPT{}, dlg.Data());
+}
+
+TEST(UnitHead, NamesAUnitOnlyWhereThereIsOne)
+{
+    const T_UNITS units;
+    EXPECT_EQ("nu", HeadWithUnit("nu", kDimNone, units));
+    EXPECT_EQ("nu", HeadWithUnit("nu", {}, units));
+    EXPECT_EQ("L (" + std::string(NameOf(units.length)) + ")",
+              HeadWithUnit("L", kDimLength, units));
 }

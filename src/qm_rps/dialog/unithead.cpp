@@ -6,7 +6,7 @@ std::string HeadWithUnit(const std::string& head, const std::optional<T_DIM>& di
                          const T_UNITS& units)
 {
     const std::string text = zql::lib::MMSGFunction::GetValue(head); // a symbol stays
-    if (!dim) return text;
+    if (!dim || *dim == kDimNone) return text;
     const auto part = [](std::string_view unit, int exponent) {
         return exponent == 1 ? std::string(unit) : std::string(unit) + std::to_string(exponent);
     };

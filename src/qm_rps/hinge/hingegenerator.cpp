@@ -72,7 +72,7 @@ int PutMoments(const T_HINGE_ELEMENT& e, const T_UNITS& units, HINGE_COMPONENT c
             continue;
         refusal.key = kAxialBeyond;
         refusal.why = MMSGFunction::Format(refusal.key,
-                                           {HingeHead(FormatText("%.6g", axial), kDimForce, units),
+                                           {HeadWithUnit(FormatText("%.6g", axial), kDimForce, units),
                                             FormatText("%.6g", -result.strength.level.tension),
                                             FormatText("%.6g", result.strength.level.compression)});
         return 0;

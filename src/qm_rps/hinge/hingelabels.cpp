@@ -2,7 +2,6 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
-#include "qm_rps/dialog/unithead.h"
 #include "qm_rps/hinge/hingefindings.h"
 
 #include <algorithm>
@@ -28,20 +27,14 @@ std::string ElementText(HINGE_ELEMENT element)
     return MMSGFunction::GetValue(at < keys.size() ? keys[at] : "IDS_PUSHOVER_Error");
 }
 
-std::string HingeHead(const std::string& name, T_DIM dim, const T_UNITS& units)
-{
-    return dim == kDimNone ? HeadWithUnit(name, std::nullopt, units)
-                           : HeadWithUnit(name, dim, units);
-}
-
 std::string StrengthHead(const std::string& name, HINGE_COMPONENT c, const T_HINGE_OWNER& owner)
 {
-    return HingeHead(name, StrengthDim(c), owner.units);
+    return HeadWithUnit(name, StrengthDim(c), owner.units);
 }
 
 std::string DeformHead(const std::string& name, HINGE_COMPONENT c, const T_HINGE_OWNER& owner)
 {
-    const std::string head = HingeHead(name, DeformDim(c, owner.type.definition), owner.units);
+    const std::string head = HeadWithUnit(name, DeformDim(c, owner.type.definition), owner.units);
     const bool rotation = IsMoment(c) && owner.type.definition == HINGE_DEFINITION::MomentRotation;
     return rotation ? head + " (rad)" : head;
 }
@@ -50,9 +43,9 @@ std::string StiffnessHead(const std::string& name, HINGE_COMPONENT c, const T_HI
 {
     const T_DIM s = StrengthDim(c), d = DeformDim(c, owner.type.definition);
     const T_DIM dim{s.force - d.force, s.length - d.length};
-    if (dim != kDimMass) return HingeHead(name, dim, owner.units);
+    if (dim != kDimMass) return HeadWithUnit(name, dim, owner.units);
     // Force over length, which elsewhere is the unit of a mass.
-    return HingeHead(name, kDimNone, owner.units) + " (" + std::string(NameOf(owner.units.force)) +
+    return HeadWithUnit(name, {}, owner.units) + " (" + std::string(NameOf(owner.units.force)) +
            "/" + std::string(NameOf(owner.units.length)) + ")";
 }
 

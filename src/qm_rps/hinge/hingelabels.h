@@ -1,6 +1,7 @@
 // Names and units that the editors of hinges show.
 #pragma once
 
+#include "qm_rps/dialog/unithead.h"
 #include "qm_rps/hinge/hingesources.h"
 
 #include <memory>
@@ -18,9 +19,7 @@ struct T_HINGE_OWNER {
 /// Text of an element type; a value outside the five is shown as an error, not refused.
 std::string ElementText(HINGE_ELEMENT element);
 
-/// A key's text, or the text itself, with the unit where the quantity has one: "Span (m)".
-std::string HingeHead(const std::string& name, T_DIM dim, const T_UNITS& units);
-/// The same for a strength, a deformation (a rotation in rad) and a stiffness of a component.
+/// HeadWithUnit of a strength, a deformation (a rotation in rad) and a stiffness of a component.
 std::string StrengthHead(const std::string& name, HINGE_COMPONENT c, const T_HINGE_OWNER& owner);
 std::string DeformHead(const std::string& name, HINGE_COMPONENT c, const T_HINGE_OWNER& owner);
 std::string StiffnessHead(const std::string& name, HINGE_COMPONENT c, const T_HINGE_OWNER& owner);

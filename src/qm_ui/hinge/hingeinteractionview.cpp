@@ -35,7 +35,7 @@ void AddStrengths(CFormView& form, SURFACE& dlg, const SURFACE::T_LEVEL& level)
         return field;
     };
     const auto force = [&](const char* name, const char* field, double& value) {
-        form.Note([=] { return HingeHead(name, kDimForce, units); });
+        form.Note([=] { return HeadWithUnit(name, kDimForce, units); });
         wide(form.Number(PlainLabel(name), Ref(value))).name = prefix + field;
         form.Note(PlainLabel(""));
     };
@@ -47,7 +47,7 @@ void AddStrengths(CFormView& form, SURFACE& dlg, const SURFACE::T_LEVEL& level)
         const std::string field =
             prefix + (aboutY ? "y." : "z.") + (largest ? "momentMax." : "moment.");
         const auto used = [&dlg, aboutY] { return dlg.IsAxisUsed(aboutY); };
-        Set(form.Note([=] { return HingeHead(name, kDimMoment, units); }), "", used);
+        Set(form.Note([=] { return HeadWithUnit(name, kDimMoment, units); }), "", used);
         Set(wide(form.Number(PlainLabel(name + "(+)"), Ref(m.pos))), field + "pos", used);
         Set(wide(form.Number(PlainLabel(name + "(-)"), Ref(m.neg))), field + "neg", used);
     };
@@ -130,7 +130,7 @@ void BuildUserInteraction(CFormView& form, CPushOverPMMInteractionDlg& dlg)
     const auto grid = std::make_shared<CPushoverPMMInteractionGrid>(dlg.m_table);
     grid->SetView(dlg.View());
     form.Columns();
-    form.Number([&dlg] { return HingeHead("Pmax", kDimForce, dlg.m_owner.units); },
+    form.Number([&dlg] { return HeadWithUnit("Pmax", kDimForce, dlg.m_owner.units); },
                 Ref(dlg.m_table.Pmax))
         .name = "Pmax";
     form.Choice(

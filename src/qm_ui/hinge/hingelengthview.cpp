@@ -18,7 +18,7 @@ std::vector<TextFn> EndHeads()
 std::string LengthHead(const char* name, bool relative, const T_UNITS& units)
 {
     return relative ? name + (" " + zql::lib::MMSGFunction::GetValue("IDS_QM_UI_HINGE_OF_L"))
-                    : HingeHead(name, kDimLength, units);
+                    : HeadWithUnit(name, kDimLength, units);
 }
 
 /// Lengths of an axis at both ends, in units of length or as fractions.
@@ -93,7 +93,7 @@ void BuildSpan(CFormView& form, CPO_HingeAlphaYSpanDlg& dlg)
 {
     form.Flag(KeyText("IDS_QM_UI_HINGE_AUTO_SPAN"), Ref(dlg.m_auto)).name = "auto";
     Set(form.Number(
-            [&dlg] { return HingeHead("IDS_RPS_PO_SKCV_Span", kDimLength, dlg.m_owner.units); },
+            [&dlg] { return HeadWithUnit("IDS_RPS_PO_SKCV_Span", kDimLength, dlg.m_owner.units); },
             Ref(dlg.m_span)),
         "span", [&dlg] { return !dlg.m_auto; });
 }
@@ -102,7 +102,7 @@ void BuildMasonry(CFormView& form, CPO_HingeMasonryDlg& dlg)
 {
     T_MASONRY_HINGE& m = dlg.m_masonry;
     const auto head = [&dlg](const char* key, T_DIM dim) -> TextFn {
-        return [&dlg, key, dim] { return HingeHead(key, dim, dlg.m_owner.units); };
+        return [&dlg, key, dim] { return HeadWithUnit(key, dim, dlg.m_owner.units); };
     };
     form.Choice(KeyText("IDS_QM_UI_HINGE_MASONRY_FORM"),
                 {[&m] { return m.form - 1; }, [&m](const int& i) { m.form = i + 1; }},

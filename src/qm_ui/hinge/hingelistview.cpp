@@ -99,7 +99,7 @@ T_GRID_BINDING HingeGrid(CPushOverHingeListDlg& dlg)
     const std::vector<std::string> heads = CPushOverHingeListDlg::Heads();
     for (std::size_t i = 0; i < heads.size(); ++i)
         b.columns.push_back({[&dlg, head = heads[i], i] {
-                                 return HingeHead(head, i < 6 ? kDimForce : kDimMoment,
+                                 return HeadWithUnit(head, i < 6 ? kDimForce : kDimMoment,
                                                   dlg.Doc().Unit().Units());
                              },
                              CELL_KIND::Number});

@@ -140,7 +140,7 @@ std::string TextOf(const P& p, const T_ROW& row)
     case KIND::Ratio:
         break;
     }
-    return HingeHead(key, kDimNone, p.dlg.m_owner.units);
+    return HeadWithUnit(key, kDimNone, p.dlg.m_owner.units);
 }
 
 /// The gap has its own entry on each side, for the sides that have one.

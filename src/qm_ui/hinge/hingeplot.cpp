@@ -99,8 +99,8 @@ T_PLOT HingeInteractionPlot(const T_PHGT_D& type, const T_YIELD_LEVEL& level,
     T_PLOT plot;
     plot.title = MMSGFunction::Format("IDS_QM_PLOT_INTERACTION", {type.name});
     plot.subtitle = what;
-    plot.x.title = values ? HingeHead("M", kDimMoment, *values) : "M / MY,max (-)";
-    plot.y.title = values ? HingeHead("IDS_QM_PLOT_AXIAL", kDimForce, *values)
+    plot.x.title = values ? HeadWithUnit("M", kDimMoment, *values) : "M / MY,max (-)";
+    plot.y.title = values ? HeadWithUnit("IDS_QM_PLOT_AXIAL", kDimForce, *values)
                           : MMSGFunction::GetValue("IDS_QM_PLOT_AXIAL_RATIO");
     T_PLOT_SERIES points; // on whole lines
     points.name = MMSGFunction::GetValue("IDS_QM_PLOT_INTERACTION_POINTS");

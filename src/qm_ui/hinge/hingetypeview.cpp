@@ -330,7 +330,7 @@ void AddStiffness(CFormView& form, DLG& dlg)
     form.Grid(std::move(b)).name = "stiffness";
     form.Note([&dlg] {
         return dlg.m_memberLength > 0.0
-                   ? HingeHead("IDS_QM_UI_HINGE_MEMBER_LENGTH", kDimLength, dlg.Owner().units) +
+                   ? HeadWithUnit("IDS_QM_UI_HINGE_MEMBER_LENGTH", kDimLength, dlg.Owner().units) +
                          ": " + ShortestText(dlg.m_memberLength)
                    : MMSGFunction::GetValue("IDS_QM_UI_HINGE_NO_MEMBER");
     });
