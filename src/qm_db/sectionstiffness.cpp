@@ -44,6 +44,11 @@ std::string FactorsOf(const T_SECT_D& section)
 
 } // namespace
 
+double ShearModulus(const T_MATL_D& m)
+{
+    return m.G.value_or(m.E / (2.0 * (1.0 + m.nu)));
+}
+
 T_SECT_FACTORS MeanFactors(const T_SECT_D& section)
 {
     T_SECT_FACTORS mean;

@@ -6,6 +6,9 @@
 
 #include <string>
 
+/// G of a material as given, else of E and Poisson's ratio.
+double ShearModulus(const T_MATL_D& material);
+
 /// Factors of a prismatic element: the mean of those of both ends.
 T_SECT_FACTORS MeanFactors(const T_SECT_D& section);
 

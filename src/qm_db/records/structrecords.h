@@ -60,12 +60,6 @@ struct T_MATL_D {
     bool operator==(const T_MATL_D&) const = default;
 };
 
-/// As given, else of E and Poisson's ratio.
-inline double ShearModulus(const T_MATL_D& m)
-{
-    return m.G.value_or(m.E / (2.0 * (1.0 + m.nu)));
-}
-
 enum class SECT_SHAPE { Value, Rectangle, Circle, Pipe, Box, IShape };
 
 /// A reinforcing bar in section coordinates, from the centroid.
