@@ -134,33 +134,22 @@ T_SECTION_CHECK_REQUEST RequestOf(const T_SECTION_CHECK_COMMAND& c)
 
 EXIT_CODE RunSectionCheck(const T_SECTION_CHECK_COMMAND& c)
 {
-    if (const EXIT_CODE code = CheckOutputs(c.file,
-                                            {{c.json, OUTPUT_KIND::Json},
-                                             {c.csv, OUTPUT_KIND::Text},
-                                             {c.sheet, OUTPUT_KIND::Sheet}},
-                                            c.overwrite);
-        code != EXIT_CODE::Done)
-        return code;
     CDBDoc doc;
-    if (const EXIT_CODE code = OpenInput(doc, c.file); code != EXIT_CODE::Done) return code;
-    const T_MODEL& model = doc.Data().Model();
-    const T_UNITS units = doc.Unit().Units();
-    std::vector<T_SECTION_PAIR> pairs;
-    if (const EXIT_CODE code = FindSectionPairs(model, c, pairs); code != EXIT_CODE::Done)
-        return code;
     T_SECTION_CHECK_REQUEST request = RequestOf(c);
-    if (const EXIT_CODE code = ReadForces(c, units, request.forces); code != EXIT_CODE::Done)
-        return code;
     std::vector<T_SECTION_CHECK> checks;
-    for (const T_SECTION_PAIR& pair : pairs) {
-        const T_SECT_D& section = model.sections.at(pair.section);
-        const T_MATL_D& material = model.materials.at(pair.material);
-        std::string why;
-        if (!CheckSection(section, material, request, units, checks.emplace_back(), why))
-            return Complain(EXIT_CODE::BadInput,
-                            c.file + ": " +
-                                Say("IDS_QM_SECC_IN", section.name, material.name, why));
-    }
+    const EXIT_CODE code = OverSections(
+        c,
+        {{c.json, OUTPUT_KIND::Json}, {c.csv, OUTPUT_KIND::Text}, {c.sheet, OUTPUT_KIND::Sheet}},
+        doc,
+        [&](std::vector<T_SECTION_PAIR>&) {
+            return ReadForces(c, doc.Unit().Units(), request.forces);
+        },
+        [&](std::size_t, const T_SECT_D& section, const T_MATL_D& material, std::string& why) {
+            return CheckSection(section, material, request, doc.Unit().Units(),
+                                checks.emplace_back(), why);
+        });
+    if (code != EXIT_CODE::Done) return code;
+    const T_UNITS units = doc.Unit().Units();
     if (c.json != "-" && c.csv != "-") {
         std::string text;
         for (const T_SECTION_CHECK& check : checks)

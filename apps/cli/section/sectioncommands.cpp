@@ -118,17 +118,7 @@ EXIT_CODE WriteAll(const T_SECTION_COMMAND& c, const std::vector<T_SECTION_ANSWE
     return code;
 }
 
-} // namespace
-
-T_SECTION_OPTIONS SectionOptionsOf(const T_SECTION_COMMAND& c)
-{
-    T_SECTION_OPTIONS o = c.options;
-    o.values = NamedIn<SECTION_VALUES>(kSectionValueNames, c.values);
-    o.law = NamedIn<SECTION_LAW>(kSectionLawNames, c.law);
-    o.core = NamedIn<SECTION_CORE>(kSectionCoreNames, c.confined);
-    return o;
-}
-
+/// The sections that are meant, with their materials. Usage and BadInput are told.
 EXIT_CODE FindSectionPairs(const T_MODEL& model, const T_SECTION_COMMAND& c,
                            std::vector<T_SECTION_PAIR>& out)
 {
@@ -148,37 +138,65 @@ EXIT_CODE FindSectionPairs(const T_MODEL& model, const T_SECTION_COMMAND& c,
                        : EXIT_CODE::Done;
 }
 
-EXIT_CODE RunSection(const T_SECTION_COMMAND& c)
+} // namespace
+
+T_SECTION_OPTIONS SectionOptionsOf(const T_SECTION_COMMAND& c)
 {
-    if (const EXIT_CODE code = CheckPlotName(c.plot); code != EXIT_CODE::Done) return code;
-    if (const EXIT_CODE code = CheckOutputs(c.file,
-                                            {{c.json, OUTPUT_KIND::Json},
-                                             {c.csv, OUTPUT_KIND::Text},
-                                             {c.sheet, OUTPUT_KIND::Sheet},
-                                             {c.plot, OUTPUT_KIND::Picture}},
-                                            c.overwrite);
-        code != EXIT_CODE::Done)
+    T_SECTION_OPTIONS o = c.options;
+    o.values = NamedIn<SECTION_VALUES>(kSectionValueNames, c.values);
+    o.law = NamedIn<SECTION_LAW>(kSectionLawNames, c.law);
+    o.core = NamedIn<SECTION_CORE>(kSectionCoreNames, c.confined);
+    return o;
+}
+
+EXIT_CODE OverSections(const T_SECTION_COMMAND& c, const std::vector<T_OUTPUT>& outputs, CDBDoc& doc,
+                       const SECTION_PREPARE_FN& prepare, const SECTION_DO_FN& each)
+{
+    if (const EXIT_CODE code = CheckOutputs(c.file, outputs, c.overwrite); code != EXIT_CODE::Done)
         return code;
-    CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, c.file); code != EXIT_CODE::Done) return code;
     const T_MODEL& model = doc.Data().Model();
-    const T_UNITS units = doc.Unit().Units();
     std::vector<T_SECTION_PAIR> pairs;
     if (const EXIT_CODE code = FindSectionPairs(model, c, pairs); code != EXIT_CODE::Done)
         return code;
-    if (!c.plot.empty() && pairs.size() > 1)
-        return Complain(EXIT_CODE::Usage, Say("IDS_QM_SECC_ONE_PICTURE"));
-    const T_SECTION_REQUEST request = RequestOf(c, units);
-    std::vector<T_SECTION_ANSWER> answers;
-    for (const T_SECTION_PAIR& pair : pairs) {
-        const T_SECT_D& section = model.sections.at(pair.section);
-        const T_MATL_D& material = model.materials.at(pair.material);
+    if (const EXIT_CODE code = prepare(pairs); code != EXIT_CODE::Done) return code;
+    for (std::size_t i = 0; i < pairs.size(); ++i) {
+        const T_SECT_D& section = model.sections.at(pairs[i].section);
+        const T_MATL_D& material = model.materials.at(pairs[i].material);
         std::string why;
-        if (!CalcSection(section, material, request, units, answers.emplace_back(), why))
+        if (!each(i, section, material, why))
             return Complain(EXIT_CODE::BadInput,
                             c.file + ": " +
                                 Say("IDS_QM_SECC_IN", section.name, material.name, why));
     }
+    return EXIT_CODE::Done;
+}
+
+EXIT_CODE RunSection(const T_SECTION_COMMAND& c)
+{
+    if (const EXIT_CODE code = CheckPlotName(c.plot); code != EXIT_CODE::Done) return code;
+    CDBDoc doc;
+    T_SECTION_REQUEST request;
+    std::vector<T_SECTION_ANSWER> answers;
+    const EXIT_CODE code = OverSections(
+        c,
+        {{c.json, OUTPUT_KIND::Json},
+         {c.csv, OUTPUT_KIND::Text},
+         {c.sheet, OUTPUT_KIND::Sheet},
+         {c.plot, OUTPUT_KIND::Picture}},
+        doc,
+        [&](std::vector<T_SECTION_PAIR>& pairs) {
+            if (!c.plot.empty() && pairs.size() > 1)
+                return Complain(EXIT_CODE::Usage, Say("IDS_QM_SECC_ONE_PICTURE"));
+            request = RequestOf(c, doc.Unit().Units());
+            return EXIT_CODE::Done;
+        },
+        [&](std::size_t, const T_SECT_D& section, const T_MATL_D& material, std::string& why) {
+            return CalcSection(section, material, request, doc.Unit().Units(),
+                               answers.emplace_back(), why);
+        });
+    if (code != EXIT_CODE::Done) return code;
+    const T_UNITS units = doc.Unit().Units();
     if (c.json != "-" && c.csv != "-") {
         std::string text;
         for (const T_SECTION_ANSWER& answer : answers)

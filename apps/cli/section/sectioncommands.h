@@ -2,8 +2,10 @@
 #pragma once
 
 #include "exitcodes.h"
+#include "qm_db/filectrl.h"
 #include "qm_rps/section/sectioncurves.h"
 
+#include <functional>
 #include <string>
 #include <vector>
 
@@ -25,9 +27,17 @@ struct T_SECTION_COMMAND {
 };
 
 T_SECTION_OPTIONS SectionOptionsOf(const T_SECTION_COMMAND& command);
-/// The sections that are meant, with their materials. Usage and BadInput are told.
-EXIT_CODE FindSectionPairs(const T_MODEL& model, const T_SECTION_COMMAND& command,
-                           std::vector<T_SECTION_PAIR>& out);
+
+/// Reads what is asked of the sections that were found, which it may change.
+using SECTION_PREPARE_FN = std::function<EXIT_CODE(std::vector<T_SECTION_PAIR>&)>;
+/// Does the pair with this index. 1 done; 0 with the reason.
+using SECTION_DO_FN =
+    std::function<int(std::size_t, const T_SECT_D&, const T_MATL_D&, std::string&)>;
+/// Opens the file once the outputs may be written, finds the sections that are meant with their
+/// materials, prepares, and does each of them. Done, or the code to exit with after one line on
+/// stderr.
+EXIT_CODE OverSections(const T_SECTION_COMMAND& command, const std::vector<T_OUTPUT>& outputs,
+                       CDBDoc& doc, const SECTION_PREPARE_FN& prepare, const SECTION_DO_FN& each);
 
 /// Calculates and prints. BadInput with the first section that has no answer, nothing written.
 EXIT_CODE RunSection(const T_SECTION_COMMAND& command);
