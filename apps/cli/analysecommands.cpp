@@ -5,7 +5,7 @@
 #include "output.h"
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
-#include "qm_db/sectionstiffness.h"
+#include "qm_db/sectionproperties.h"
 #include "qm_rps/desk/elementlist.h"
 #include "json/analysisjson.h"
 

@@ -3,7 +3,7 @@
 #include "qm_base/messagehistory.h"
 #include "qm_base/msgfunction.h"
 #include "qm_db/filectrl.h"
-#include "qm_db/sectionstiffness.h"
+#include "qm_db/sectionproperties.h"
 
 #include <filesystem>
 #include <memory>

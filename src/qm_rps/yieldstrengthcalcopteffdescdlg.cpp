@@ -65,9 +65,9 @@ std::vector<std::string> CYieldStrengthCalcOptEffDescDlg::Heads() const
         for (const T_PROPERTY& p : kProperties)
             heads.push_back(HeadWithUnit(std::string(p.symbol) + end, p.dim, m_units));
     for (const char* symbol : {"Zy", "Zz"})
-        heads.push_back(HeadWithUnit(symbol, {0, 3}, m_units));
+        heads.push_back(HeadWithUnit(symbol, T_DIM{0, 3}, m_units));
     for (const char* symbol : {"Avy", "Avz"})
-        heads.push_back(HeadWithUnit(symbol, {0, 2}, m_units));
+        heads.push_back(HeadWithUnit(symbol, T_DIM{0, 2}, m_units));
     return heads;
 }
 

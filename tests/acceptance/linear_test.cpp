@@ -187,8 +187,8 @@ TEST_F(Linear, PictureOfTheDeformedShapeStatesItsScale)
 }
 #endif
 
-// By hand: L 2 m, mean Iy factor 0.4, area factor 0.5: UZ = 12 L3/(3 E 0.4 Iy), UX = 100 L/(E 0.5 A);
-// warmed by 50 degrees alpha 50 L whatever EA is; weight density g A L of the whole area.
+// By hand: L 2 m, mean Iy factor 0.4, area factor 0.5: UZ = 12 L3/(3 E 0.4 Iy), UX = 100 L/(E 0.5
+// A); warmed by 50 degrees alpha 50 L whatever EA is; weight density g A L of the whole area.
 TEST_F(Linear, StiffnessFactorsOfSectionsCountAndNotInTheWeight)
 {
     json file = json::parse(R"({"format": "qm-rps case 1",
@@ -210,8 +210,7 @@ TEST_F(Linear, StiffnessFactorsOfSectionsCountAndNotInTheWeight)
     EXPECT_NEAR(1e-4, moved[0], 1e-14);
     EXPECT_NEAR(1.2e-3, r["displacements"]["T"]["2"][0], 1e-13);
     EXPECT_NEAR(7.85 * 9.80665 * 0.02 * 2, r["reactions"]["W"]["1"][2], 1e-9);
-    ExpectHolds(Run("analyse c.json").err,
-                {"cracked: area 0.5, Iyy 0.4 (0.3 at I, 0.5 at J)"});
+    ExpectHolds(Run("analyse c.json").err, {"cracked: area 0.5, Iyy 0.4 (0.3 at I, 0.5 at J)"});
     file["sections"][0]["factors_J"]["Iyy"] = 0;
     Write("c.json", file.dump(1));
     (void)ExpectRefused("analyse c.json", 3, "stiffness factor");

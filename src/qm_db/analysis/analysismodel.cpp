@@ -1,7 +1,7 @@
 #include "qm_db/analysis/analysismodel.h"
 
 #include "qm_base/say.h"
-#include "qm_db/sectionstiffness.h"
+#include "qm_db/sectionproperties.h"
 
 #include <algorithm>
 

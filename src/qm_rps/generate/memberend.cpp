@@ -1,7 +1,7 @@
 #include "qm_rps/generate/memberend.h"
 
 #include "qm_base/say.h"
-#include "qm_db/sectionstiffness.h"
+#include "qm_db/sectionproperties.h"
 #include "qm_rps/generate/rcmember.h"
 #include "qm_rps/push/pushstoreys.h"
 
@@ -248,9 +248,9 @@ T_MEMBER_END EndOf(const T_MODEL& model, const T_HINGE_MEMBER& member,
     const auto axis = std::ranges::find(member.bending, component) - member.bending.begin();
     const std::size_t place = 4 * static_cast<std::size_t>(axis) + (atI ? 0 : 2);
     if (place + 1 < member.pushed.size() && member.pushed[place] > 0.0)
-        end.pushed = T_PUSHED_SHEAR{
-            member.pushed[place],
-            std::clamp(member.pushed[place + 1], end.LeastSpan(), end.LongestSpan())};
+        end.pushed =
+            T_PUSHED_SHEAR{member.pushed[place], std::clamp(member.pushed[place + 1],
+                                                            end.LeastSpan(), end.LongestSpan())};
     return end;
 }
 

@@ -71,10 +71,10 @@ int PutMoments(const T_HINGE_ELEMENT& e, const T_UNITS& units, HINGE_COMPONENT c
                                          fault))
             continue;
         refusal.key = kAxialBeyond;
-        refusal.why = MMSGFunction::Format(refusal.key,
-                                           {HeadWithUnit(FormatText("%.6g", axial), kDimForce, units),
-                                            FormatText("%.6g", -result.strength.level.tension),
-                                            FormatText("%.6g", result.strength.level.compression)});
+        refusal.why = MMSGFunction::Format(
+            refusal.key, {HeadWithUnit(FormatText("%.6g", axial), kDimForce, units),
+                          FormatText("%.6g", -result.strength.level.tension),
+                          FormatText("%.6g", result.strength.level.compression)});
         return 0;
     }
     return 1;

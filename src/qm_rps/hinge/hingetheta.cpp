@@ -1,6 +1,6 @@
 #include "qm_rps/hinge/hingetheta.h"
 
-#include "qm_db/sectionstiffness.h"
+#include "qm_db/sectionproperties.h"
 
 #include <cmath>
 

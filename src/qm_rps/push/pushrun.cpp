@@ -2,7 +2,7 @@
 
 #include "qm_base/say.h"
 #include "qm_db/recordfacts.h"
-#include "qm_db/sectionstiffness.h"
+#include "qm_db/sectionproperties.h"
 #include "qm_rps/push/loadalgebra.h"
 #include "qm_rps/push/pushcollector.h"
 #include "qm_rps/push/pushwarnings.h"

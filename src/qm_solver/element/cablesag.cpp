@@ -20,8 +20,8 @@ double SagFactor(const T_FRAME& frame, const T_ELEMENT& element, double tension)
         material.density * section.A * frame.gravity * std::hypot(j[0] - i[0], j[1] - i[1]);
     if (!(across > 0.0)) return 1.0;
     if (!(tension > 0.0)) return kLeast;
-    const double sag = across / tension * (across / tension) * material.E * section.StiffA() /
-                       (12.0 * tension);
+    const double sag =
+        across / tension * (across / tension) * material.E * section.StiffA() / (12.0 * tension);
     return std::max(kLeast, 1.0 / (1.0 + sag));
 }
 

@@ -100,7 +100,7 @@ T_GRID_BINDING HingeGrid(CPushOverHingeListDlg& dlg)
     for (std::size_t i = 0; i < heads.size(); ++i)
         b.columns.push_back({[&dlg, head = heads[i], i] {
                                  return HeadWithUnit(head, i < 6 ? kDimForce : kDimMoment,
-                                                  dlg.Doc().Unit().Units());
+                                                     dlg.Doc().Unit().Units());
                              },
                              CELL_KIND::Number});
     const auto rows = std::make_shared<std::vector<CPushOverHingeListDlg::T_ROW>>();

@@ -69,8 +69,8 @@ TEST(HingeTheta, FollowsComponentEndAndOption)
     }
     T_MATL_D given = material;
     given.G = 50000; // goes before E / 2.6
-    const double D = CHingeTheta::CalcThetaShear({&section, &given, 4000}, C::Fy, L::IEnd,
-                                                 S::Elastic, 0, 1e5);
+    const double D =
+        CHingeTheta::CalcThetaShear({&section, &given, 4000}, C::Fy, L::IEnd, S::Elastic, 0, 1e5);
     EXPECT_NEAR(2e-3, D, 1e-12);
 }
 

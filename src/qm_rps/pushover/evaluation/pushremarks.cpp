@@ -3,7 +3,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_db/recordfacts.h"
-#include "qm_db/sectionstiffness.h"
+#include "qm_db/sectionproperties.h"
 #include "qm_rps/pushover/adrsformulas.h"
 #include "qm_rps/pushover/evaluation/missedvertex.h"
 
