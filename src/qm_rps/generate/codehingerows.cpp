@@ -24,9 +24,9 @@ bool Alike(const T_CODE_POINT& a, const T_CODE_POINT& b)
 bool Alike(const T_CODE_SIDE& a, const T_CODE_SIDE& b)
 {
     const T_CODE_BACKBONE &p = a.bone, &q = b.bone;
-    return Near(a.strength, b.strength) && Near(a.shearStrength, b.shearStrength) &&
-           Near(p.yieldDeform, q.yieldDeform) && Alike(p.C, q.C) && Alike(p.D, q.D) &&
-           Alike(p.E, q.E);
+    return Near(a.strength, b.strength) && Near(a.shear, b.shear) &&
+           Near(a.shearStrength, b.shearStrength) && Near(p.yieldDeform, q.yieldDeform) &&
+           Alike(p.C, q.C) && Alike(p.D, q.D) && Alike(p.E, q.E);
 }
 
 std::string Power(std::string_view unit, int exponent)

@@ -134,9 +134,9 @@ void WarnRelieved(const T_HINGE_MEMBER& member, T_CODE_HINGE& hinge)
         const double I = member.pushed[at], J = member.pushed[at + 2];
         const double less = std::min(I, J), more = std::max(I, J);
         if (less > 0.0 && less < kMuchLess * more)
-            hinge.warnings.push_back({"IDS_QM_GEN_WARN_RELIEVED",
-                                      {I < J ? "I" : "J", CodeNumber(less / 1000.0),
-                                       CodeNumber(more / 1000.0)}});
+            hinge.warnings.push_back(
+                {"IDS_QM_GEN_WARN_RELIEVED",
+                 {I < J ? "I" : "J", CodeNumber(less / 1000.0), CodeNumber(more / 1000.0)}});
     }
 }
 

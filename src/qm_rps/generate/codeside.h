@@ -76,8 +76,7 @@ struct T_MEMBER_END {
     /// Along the shear force.
     double Depth() const
     {
-        const bool round =
-            section.shape == SECT_SHAPE::Circle || section.shape == SECT_SHAPE::Pipe;
+        const bool round = section.shape == SECT_SHAPE::Circle || section.shape == SECT_SHAPE::Pipe;
         return section.size[aboutY || round ? 0 : 1];
     }
     /// A point without a moment close to the end does not make a member squat.

@@ -76,11 +76,8 @@ std::optional<T_MEMBER_AXES> AxesOf(const T_MODEL& model, const T_ELEM_D& e)
 
 T_END_STATE Between(const T_END_STATE& a, const T_END_STATE& b, double at)
 {
-    using S = T_END_STATE;
-    constexpr std::array<double S::*, 7> kMembers{&S::N,     &S::M,      &S::V,          &S::across,
-                                                  &S::chord, &S::flowed, &S::hingeMoment};
     T_END_STATE s;
-    for (double S::*m : kMembers)
+    for (double T_END_STATE::*m : kEndStateMembers)
         s.*m = a.*m + at * (b.*m - a.*m);
     return s;
 }
