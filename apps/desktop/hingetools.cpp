@@ -35,6 +35,10 @@ void RunCodeHinges(T_DESKTOP& desktop)
 {
     CCodeHingeDlg dialog(desktop.doc);
     dialog.SetView(&desktop.view);
+    dialog.m_withProgress = [&desktop](const auto& work) {
+        return RunWithProgress(desktop.window, QString::fromStdString(Say("IDS_QM_UI_GEN_PUSHING")),
+                               work);
+    };
     (void)dialog.DoModal();
     desktop.changed();
 }
@@ -60,12 +64,14 @@ void RunSectionCurves(T_DESKTOP& desktop, int section)
 {
     CSectionCurvesDlg curves(desktop.doc);
     curves.SetView(&desktop.view);
-    curves.m_askFile = [&desktop] {
+    const auto ask = [&desktop](bool save) {
         const auto text = [](const char* key) { return QString::fromStdString(Say(key)); };
-        return AskFileName(desktop.window, true, text("IDS_QM_UI_SECC_TITLE"),
-                           text("IDS_QM_UI_SECC_FILES"))
+        return AskFileName(desktop.window, save, text("IDS_QM_UI_SECC_TITLE"),
+                           text(save ? "IDS_QM_UI_SECC_FILES" : "IDS_QM_UI_SECK_FILES"))
             .toStdString();
     };
+    curves.m_askFile = [&ask] { return ask(true); };
+    curves.m_askSets = [&ask] { return ask(false); };
     curves.OnOpenSection(section);
     (void)curves.DoModal();
 }

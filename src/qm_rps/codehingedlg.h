@@ -9,6 +9,7 @@
 #include "qm_rps/generate/codehingerows.h"
 #include "qm_rps/generate/generatedtypes.h"
 
+#include <functional>
 #include <set>
 
 class CCodeHingeDlg : public zql::frx::MDialog {
@@ -39,6 +40,11 @@ public:
     bool AsksConnection() const { return m_options.AsksConnection(Chosen()); }
     /// After each change of the options.
     void OnOptions() { Forget(); }
+
+    /// Runs work that tells parts done of a total and stops where that asks it to (false); set by
+    /// the application. Empty: pushes run untold.
+    using TELL_FN = std::function<bool(std::size_t, std::size_t)>;
+    std::function<int(const std::function<int(TELL_FN)>&)> m_withProgress;
 
     // ---- what they would get ----
     /// Works the hinges out, with the pushes that they need; the document stays as it is. 0:
@@ -77,6 +83,7 @@ public:
 
 private:
     std::vector<int> Chosen() const { return {m_elements.begin(), m_elements.end()}; }
+    int WithProgress(const std::function<int(const PUSH_PROGRESS_FN&)>& work) const;
     void Forget();
     void Take(T_CODE_HINGES hinges);
     void Show();

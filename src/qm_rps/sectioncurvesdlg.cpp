@@ -3,7 +3,10 @@
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
 #include "qm_db/filectrl.h"
+#include "qm_rps/desk/elementlist.h"
 #include "qm_rps/desk/tracetable.h"
+#include "qm_rps/dialog/unithead.h"
+#include "qm_rps/section/forcesets.h"
 #include "qm_rps/section/sectionchecktable.h"
 #include "qm_rps/section/sectionexport.h"
 
@@ -15,6 +18,7 @@ CSectionCurvesDlg::CSectionCurvesDlg(CDBDoc& doc)
     : m_doc(doc), m_pairs(SectionPairs(doc.Data().Model()))
 {
     if (!m_pairs.empty()) m_pair = 0;
+    OnNewSet();
 }
 
 std::vector<std::string> CSectionCurvesDlg::PairTexts() const
@@ -55,8 +59,9 @@ void CSectionCurvesDlg::OnChanged()
 {
     m_answers.clear();
     m_check.reset();
-    m_way = std::min(m_way, static_cast<int>(std::ssize(CheckedWays())) - 1);
-    if (m_way < 0 && !CheckedWays().empty()) m_way = 0;
+    const int count = static_cast<int>(WayCount());
+    m_way = std::min(m_way, count - 1);
+    if (m_way < 0 && count > 0) m_way = 0;
 }
 
 // ---- curves -------------------------------------------------------------------------------------
@@ -148,50 +153,166 @@ bool CSectionCurvesDlg::IsConcrete() const
     return m_doc.Data().Model().materials.at(material).type == MATL_CLASS::Concrete;
 }
 
+std::string CSectionCurvesDlg::SetHead(std::size_t column) const
+{
+    if (column == 0) return Say("IDS_QM_SECK_HEAD_SET");
+    const T_SECTION_FORCE& force = kSectionForces[column - 1];
+    return HeadWithUnit(force.name, force.dim, Units());
+}
+
+std::string CSectionCurvesDlg::SetText(std::size_t row, std::size_t column) const
+{
+    if (row >= m_sets.size() || column >= kSetColumns) return {};
+    const T_SECTION_FORCES& set = m_sets[row];
+    return column == 0 ? set.name : ShortestText(set.*kSectionForces[column - 1].value);
+}
+
+int CSectionCurvesDlg::SetCell(std::size_t row, std::size_t column, const std::string& text)
+{
+    if (row >= m_sets.size() || column >= kSetColumns) return 0;
+    const std::optional<double> number = ParseFinite(text);
+    if (column > 0 && !number) return 0;
+    if (column == 0)
+        m_sets[row].name = text;
+    else
+        m_sets[row].*kSectionForces[column - 1].value = *number;
+    OnChanged();
+    return 1;
+}
+
+void CSectionCurvesDlg::OnNewSet()
+{
+    T_SECTION_FORCES& set = m_sets.emplace_back();
+    set.name = std::to_string(m_sets.size());
+    m_set = static_cast<int>(m_sets.size()) - 1;
+    OnChanged();
+}
+
+void CSectionCurvesDlg::OnDeleteSet()
+{
+    if (m_set < 0 || m_set >= std::ssize(m_sets)) return;
+    m_sets.erase(m_sets.begin() + m_set);
+    m_set = std::min(m_set, static_cast<int>(m_sets.size()) - 1);
+    OnChanged();
+}
+
+/// Of SI.
+int CSectionCurvesDlg::TakeSets(std::vector<T_SECTION_FORCES> sets)
+{
+    for (T_SECTION_FORCES& set : sets)
+        for (const T_SECTION_FORCE& force : kSectionForces)
+            set.*force.value = FromSi(set.*force.value, Units(), force.dim) + 0.0;
+    m_sets = std::move(sets);
+    m_set = m_sets.empty() ? -1 : 0;
+    OnChanged();
+    return 1;
+}
+
+int CSectionCurvesDlg::OnReadSets()
+{
+    const std::string path = m_askSets ? m_askSets() : std::string();
+    if (path.empty()) return 1;
+    std::string text, reason;
+    T_FILE_ERROR error;
+    std::vector<T_SECTION_FORCES> sets;
+    if (!CFileCtrl::ReadWholeFile(path, text, error))
+        reason = error.text;
+    else if (ReadForceSets(text, Units(), sets, reason))
+        return TakeSets(std::move(sets));
+    ShowMessage("IDS_QM_UI_SECK_NO_SETS", Say("IDS_QM_UI_SECK_NO_SETS", reason));
+    return 0;
+}
+
+std::vector<std::string> CSectionCurvesDlg::LoadCases() const
+{
+    std::vector<std::string> names;
+    for (const auto& entry : m_doc.Data().Model().loadCases)
+        names.push_back(entry.second.name);
+    for (const auto& entry : m_doc.Data().Model().combinations)
+        names.push_back(entry.second.name);
+    return names;
+}
+
+int CSectionCurvesDlg::OnTakeResults()
+{
+    const std::vector<std::string> names = LoadCases();
+    const auto elements = ParseElementList(m_elements);
+    std::string reason;
+    std::vector<T_SECTION_JOB> jobs;
+    if (!elements)
+        reason = Say("IDS_QM_CLI_HINGE_ELEMENT_LIST", m_elements);
+    else if (m_pair < 0 || m_loadCase < 0 || m_loadCase >= std::ssize(names))
+        reason = Say(m_pair < 0 ? "IDS_QM_SECC_NONE" : "IDS_QM_CLI_NO_CASES");
+    else if (ForcesOfMembers(m_doc, names[static_cast<std::size_t>(m_loadCase)], *elements, jobs,
+                             reason)) {
+        const T_SECTION_PAIR& pair = m_pairs[static_cast<std::size_t>(m_pair)];
+        const auto job = std::ranges::find(jobs, pair, &T_SECTION_JOB::pair);
+        if (job != jobs.end()) return TakeSets(std::move(job->forces));
+        reason = Say("IDS_QM_SECK_NO_RESULTS", names[static_cast<std::size_t>(m_loadCase)]);
+    }
+    ShowMessage("IDS_QM_UI_SECK_NO_SETS", Say("IDS_QM_UI_SECK_NO_SETS", reason));
+    return 0;
+}
+
 const CSectionCurvesDlg::T_PAGE<T_SECTION_CHECK>& CSectionCurvesDlg::Checked()
 {
     if (m_check) return *m_check;
     T_PAGE<T_SECTION_CHECK>& page = m_check.emplace();
-    if (m_pair < 0 || m_forces == T_SECTION_FORCES{}) {
-        page.reason = Say(m_pair < 0 ? "IDS_QM_SECC_NONE" : "IDS_QM_UI_SECK_NO_FORCES");
-        return page;
-    }
     T_SECTION_CHECK_REQUEST request;
     request.options = m_options;
     if (m_checkCode > 0) request.codes = {static_cast<SECTION_CHECK_CODE>(m_checkCode - 1)};
     request.cotTheta = m_cotTheta;
-    T_SECTION_FORCES& forces = request.forces.emplace_back();
-    for (const T_SECTION_FORCE& force : kSectionForces)
-        forces.*force.value = ToSi(m_forces.*force.value, Units(), force.dim);
+    request.forces = m_sets;
+    bool any = false;
+    for (T_SECTION_FORCES& set : request.forces)
+        for (const T_SECTION_FORCE& force : kSectionForces) {
+            set.*force.value = ToSi(set.*force.value, Units(), force.dim);
+            any = any || set.*force.value != 0.0;
+        }
+    if (m_pair < 0 || !any) {
+        page.reason = Say(m_pair < 0 ? "IDS_QM_SECC_NONE" : "IDS_QM_UI_SECK_NO_FORCES");
+        return page;
+    }
     const T_SECTION_PAIR& pair = m_pairs[static_cast<std::size_t>(m_pair)];
     const T_MODEL& model = m_doc.Data().Model();
     T_SECTION_CHECK check;
     if (CheckSection(model.sections.at(pair.section), model.materials.at(pair.material), request,
                      Units(), check, page.reason))
         page.answer = std::move(check);
+    if (page.answer && m_byRatio) SortByRatio(*page.answer);
     return page;
 }
 
-const std::vector<T_SECTION_WAY>& CSectionCurvesDlg::CheckedWays()
+std::size_t CSectionCurvesDlg::WayCount()
 {
-    static const std::vector<T_SECTION_WAY> kNone;
     const T_PAGE<T_SECTION_CHECK>& page = Checked();
-    return page.answer ? page.answer->sets.front().ways : kNone;
+    std::size_t count = 0;
+    if (page.answer)
+        for (const T_SECTION_CHECKS& set : page.answer->sets)
+            count += set.ways.size();
+    return count;
 }
 
 T_TEXT_TABLE CSectionCurvesDlg::Ways()
 {
-    return SectionWaysTable(CheckedWays());
+    const T_PAGE<T_SECTION_CHECK>& page = Checked();
+    return SectionSetsTable(page.answer ? *page.answer : T_SECTION_CHECK());
 }
 
 const T_SECTION_WAY* CSectionCurvesDlg::WayAt(std::size_t row)
 {
-    return row < CheckedWays().size() ? &CheckedWays()[row] : nullptr;
+    const T_PAGE<T_SECTION_CHECK>& page = Checked();
+    if (!page.answer) return nullptr;
+    for (const T_SECTION_CHECKS& set : page.answer->sets) {
+        if (row < set.ways.size()) return &set.ways[row];
+        row -= set.ways.size();
+    }
+    return nullptr;
 }
 
 void CSectionCurvesDlg::OnWay(int row)
 {
-    if (row >= 0 && row < std::ssize(CheckedWays())) m_way = row;
+    if (row >= 0 && static_cast<std::size_t>(row) < WayCount()) m_way = row;
 }
 
 T_TEXT_TABLE CSectionCurvesDlg::WayTrace()

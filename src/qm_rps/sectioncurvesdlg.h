@@ -44,14 +44,34 @@ public:
     int OnExport(SECTION_TASK task);
 
     // ---- given forces ----
-    /// In units of the document; OnChanged after a change, as for the two below.
-    T_SECTION_FORCES m_forces;
+    /// Sets in units of the document, the first one without forces; the chosen one, -1: none.
+    std::vector<T_SECTION_FORCES> m_sets;
+    int m_set = 0;
+    /// A name, then the forces in the order of kSectionForces.
+    static constexpr std::size_t kSetColumns = 1 + kSectionForces.size();
+    std::string SetHead(std::size_t column) const;
+    std::string SetText(std::size_t row, std::size_t column) const;
+    /// 1 taken; 0 no such cell, or no finite number.
+    int SetCell(std::size_t row, std::size_t column, const std::string& text);
+    void OnNewSet();
+    void OnDeleteSet();
+    /// Asks for a file to read; set by the application. Empty: cancelled.
+    std::function<std::string()> m_askSets;
+    /// Puts the sets of a file (ReadForceSets), or the results of m_loadCase in m_elements that
+    /// have the shown section (ForcesOfMembers), in place of the sets. 1 done, or cancelled; 0 with
+    /// a message.
+    int OnReadSets();
+    int OnTakeResults();
+    std::vector<std::string> LoadCases() const; // and combinations
+    int m_loadCase = 0;
+    std::string m_elements; // "1,5-9"; empty: all
+    bool m_byRatio = false; // the worst set first; OnChanged after a change, as for the two below
     /// Whose rules beside those of no code: 0 all that fit, 1 the first of kSectionCheckCodeNames.
     int m_checkCode = 0;
     double m_cotTheta = 1.0;
     bool IsConcrete() const; // its shear asks for cot theta
 
-    /// Ways of checking, with ratios and verdicts: the rows of Ways.
+    /// Sets and ways of checking, with ratios and verdicts.
     T_TEXT_TABLE Ways();
     const T_SECTION_WAY* WayAt(std::size_t row);
     int Way() const { return m_way; } // chosen row; -1: none
@@ -71,7 +91,8 @@ private:
     };
     const T_PAGE<T_SECTION_ANSWER>& Page(SECTION_TASK task);
     const T_PAGE<T_SECTION_CHECK>& Checked();
-    const std::vector<T_SECTION_WAY>& CheckedWays();
+    std::size_t WayCount();
+    int TakeSets(std::vector<T_SECTION_FORCES> sets);
     bool ReadAxial(std::vector<double>& out) const;
     int Export(const std::function<T_TEXT_TABLE()>& table);
 

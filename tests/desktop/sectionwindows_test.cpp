@@ -67,22 +67,29 @@ TEST_F(DesktopTest, GivenForcesAreCheckedTracedAndExported)
         QAbstractItemModel& ways = Grid(w, "check.table").Model();
         EXPECT_EQ(0, ways.rowCount());
         Push(w, "check.export"); // refused: there is nothing
-        Enter(w, "check.N", "400");
-        Enter(w, "check.My", "100");
+        QAbstractItemModel& sets = Grid(w, "check.sets").Model();
+        EXPECT_TRUE(sets.setData(sets.index(0, 1), "400"));
+        EXPECT_TRUE(sets.setData(sets.index(0, 2), "100"));
         ASSERT_LT(2, ways.rowCount());
         EXPECT_TRUE(Field(w, "check.cotTheta")->isHidden());
-        EXPECT_EQ("section calculator", Cell(ways, 1, 1));
-        EXPECT_NEAR(400 / 2070.75, Cell(ways, 0, 2).toDouble(), 5e-5);
-        EXPECT_NEAR(100 / 154.345, Cell(ways, 1, 2).toDouble(), 5e-5);
-        EXPECT_EQ("kept", Cell(ways, 1, 3));
+        EXPECT_EQ("section calculator", Cell(ways, 1, 2));
+        EXPECT_NEAR(400 / 2070.75, Cell(ways, 0, 3).toDouble(), 5e-5);
+        EXPECT_NEAR(100 / 154.345, Cell(ways, 1, 3).toDouble(), 5e-5);
+        EXPECT_EQ("kept", Cell(ways, 1, 4));
         Grid(w, "check.table").setCurrentIndex(ways.index(1, 0));
         QAbstractItemModel& trace = Grid(w, "check.trace").Model();
         ASSERT_EQ(3, trace.rowCount()); // M, MR, ratio
         EXPECT_EQ("MR", Cell(trace, 1, 0));
         EXPECT_NEAR(154.345, Cell(trace, 1, 1).toDouble(), 5e-3);
         EXPECT_EQ("kN m", Cell(trace, 1, 2));
-        Enter(w, "check.My", "160");
-        EXPECT_EQ("EXCEEDED", Cell(ways, 1, 3));
+        const int ofOne = ways.rowCount();
+        Push(w, "IDS_QM_UI_SECK_NEW");
+        EXPECT_TRUE(sets.setData(sets.index(1, 0), "more"));
+        EXPECT_TRUE(sets.setData(sets.index(1, 1), "400"));
+        EXPECT_TRUE(sets.setData(sets.index(1, 2), "160"));
+        EXPECT_EQ("EXCEEDED", Cell(ways, ofOne + 1, 4));
+        Check(w, "check.byRatio");
+        EXPECT_EQ("more", Cell(ways, 0, 0)); // the worse set first
         const int all = ways.rowCount();
         ChooseIndex(Field(w, "check.code"), 1); // EN alone
         EXPECT_GT(all, ways.rowCount());
@@ -96,5 +103,5 @@ TEST_F(DesktopTest, GivenForcesAreCheckedTracedAndExported)
     QFile csv(file);
     ASSERT_TRUE(csv.open(QIODevice::ReadOnly));
     EXPECT_TRUE(csv.readAll().contains(
-        "HEB200,S275,400,160,0,0,0,0,bending,section calculator,1.037,EXCEEDED\n"));
+        "HEB200,S275,more,400,160,0,0,0,0,bending,section calculator,1.037,EXCEEDED\n"));
 }

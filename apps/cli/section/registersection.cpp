@@ -77,6 +77,10 @@ void AddCheck(const T_GROUP& group)
                                                "IDS_QM_HELP_SECK_VZ",    "IDS_QM_HELP_SECK_T"};
     for (std::size_t i = 0; i < kHelp.size(); ++i)
         sub->add_option(std::string("--") + kSectionForceNames[i], o->forces[i], Say(kHelp[i]));
+    sub->add_option("--forces", o->forcesFile, Say("IDS_QM_HELP_SECK_FORCES"));
+    sub->add_option("--case", o->cases, Say("IDS_QM_HELP_SECK_CASE"));
+    sub->add_option("--elements", o->elements, Say("IDS_QM_HELP_SECK_ELEMENTS"));
+    sub->add_flag("--by-ratio", o->byRatio, Say("IDS_QM_HELP_SECK_BY_RATIO"));
     sub->add_option("--code", o->codes, Say("IDS_QM_HELP_SECK_CODE"))
         ->check(OneOf(kSectionCheckCodeNames));
     sub->add_option("--cot-theta", o->cotTheta, Say("IDS_QM_HELP_SECK_COT"));

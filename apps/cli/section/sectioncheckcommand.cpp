@@ -1,15 +1,20 @@
 #include "section/sectioncheckcommand.h"
 
+#include "analysecommands.h"
+#include "analysis/analysisresults.h"
 #include "console/tabletext.h"
 #include "inputfile.h"
 #include "output.h"
 #include "qm_base/say.h"
+#include "qm_rps/desk/elementlist.h"
+#include "qm_rps/section/forcesets.h"
 #include "qm_rps/section/sectionchecktable.h"
 #include "qm_rps/section/sectionexport.h"
 #include "json/tracejson.h"
 
 #include <algorithm>
 #include <cstdio>
+#include <iterator>
 
 namespace {
 
@@ -27,11 +32,82 @@ EXIT_CODE ReadForces(const T_SECTION_CHECK_COMMAND& c, const T_UNITS& units,
     }
     for (std::size_t i = 0; i < count; ++i) {
         T_SECTION_FORCES& forces = out.emplace_back();
+        forces.name = std::to_string(i + 1);
         for (std::size_t k = 0; k < c.forces.size(); ++k)
             if (const std::vector<double>& list = c.forces[k]; !list.empty())
                 forces.*kSectionForces[k].value =
                     ToSi(list[list.size() > 1 ? i : 0], units, kSectionForces[k].dim);
     }
+    return EXIT_CODE::Done;
+}
+
+/// The sets of the file behind those of the options.
+EXIT_CODE ReadFile(const T_SECTION_CHECK_COMMAND& c, const T_UNITS& units,
+                   std::vector<T_SECTION_FORCES>& out)
+{
+    std::string text, reason;
+    T_FILE_ERROR error;
+    std::vector<T_SECTION_FORCES> sets;
+    if (!CFileCtrl::ReadWholeFile(c.forcesFile, text, error)) return ReportFileError(error);
+    if (!ReadForceSets(text, units, sets, reason))
+        return Complain(EXIT_CODE::BadInput, c.forcesFile + ": " + reason);
+    out.insert(out.end(), sets.begin(), sets.end());
+    return EXIT_CODE::Done;
+}
+
+/// Analyses the load cases; their forces in the elements whose section is meant.
+EXIT_CODE ReadResults(const T_SECTION_CHECK_COMMAND& c, CDBDoc& doc,
+                      const std::vector<T_SECTION_PAIR>& meant, std::vector<T_SECTION_JOB>& jobs)
+{
+    const auto elements = ParseElementList(c.elements);
+    if (!elements)
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_HINGE_ELEMENT_LIST", c.elements));
+    std::vector<T_SHOWN_CASE> shown;
+    std::vector<int> keys;
+    std::string error;
+    if (!FindShownCases(doc, c.cases, shown, error))
+        return Complain(EXIT_CODE::Usage, c.file + ": " + error);
+    if (!LoadCasesOf(doc, shown, keys, error))
+        return Complain(EXIT_CODE::BadInput, c.file + ": " + error);
+    if (const EXIT_CODE code = Analyse(doc, keys, 0); code != EXIT_CODE::Done) return code;
+    for (const std::string& name : c.cases) {
+        std::vector<T_SECTION_JOB> found;
+        if (!ForcesOfMembers(doc, name, *elements, found, error))
+            return Complain(EXIT_CODE::BadInput, c.file + ": " + error);
+        for (T_SECTION_JOB& job : found) {
+            if (std::ranges::find(meant, job.pair) == meant.end()) continue;
+            const auto same = std::ranges::find(jobs, job.pair, &T_SECTION_JOB::pair);
+            T_SECTION_JOB& to =
+                same == jobs.end() ? jobs.emplace_back(T_SECTION_JOB{job.pair, {}}) : *same;
+            std::ranges::move(job.forces, std::back_inserter(to.forces));
+        }
+    }
+    return jobs.empty() ? Complain(EXIT_CODE::BadInput, c.file + ": " + Say("IDS_QM_SECC_NONE"))
+                        : EXIT_CODE::Done;
+}
+
+/// What each section is checked for; `pairs` become those that have forces.
+EXIT_CODE ReadJobs(const T_SECTION_CHECK_COMMAND& c, CDBDoc& doc,
+                   std::vector<T_SECTION_PAIR>& pairs, std::vector<T_SECTION_JOB>& jobs)
+{
+    const T_UNITS units = doc.Unit().Units();
+    std::vector<T_SECTION_FORCES> given;
+    if (const EXIT_CODE code = ReadForces(c, units, given); code != EXIT_CODE::Done) return code;
+    const bool isGiven = !given.empty() || !c.forcesFile.empty();
+    if ((isGiven && !c.cases.empty()) || (c.cases.empty() && !c.elements.empty()))
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_SECK_EITHER"));
+    if (!c.cases.empty()) {
+        if (const EXIT_CODE code = ReadResults(c, doc, pairs, jobs); code != EXIT_CODE::Done)
+            return code;
+        pairs.clear();
+        for (const T_SECTION_JOB& job : jobs)
+            pairs.push_back(job.pair);
+        return EXIT_CODE::Done;
+    }
+    if (!c.forcesFile.empty())
+        if (const EXIT_CODE code = ReadFile(c, units, given); code != EXIT_CODE::Done) return code;
+    for (const T_SECTION_PAIR& pair : pairs)
+        jobs.push_back({pair, given});
     return EXIT_CODE::Done;
 }
 
@@ -51,6 +127,7 @@ void WriteWay(CJsonText& w, const T_SECTION_WAY& way, const T_UNITS& units)
 void WriteSet(CJsonText& w, const T_SECTION_CHECKS& set, const T_UNITS& units)
 {
     w.Object();
+    w.Member("name", set.forces.name);
     w.Key("forces").Object(kJsonOneLine);
     for (const T_SECTION_FORCE& force : kSectionForces)
         w.Member(force.name, FromSi(set.forces.*force.value, units, force.dim));
@@ -136,17 +213,18 @@ EXIT_CODE RunSectionCheck(const T_SECTION_CHECK_COMMAND& c)
 {
     CDBDoc doc;
     T_SECTION_CHECK_REQUEST request = RequestOf(c);
+    std::vector<T_SECTION_JOB> jobs;
     std::vector<T_SECTION_CHECK> checks;
     const EXIT_CODE code = OverSections(
-        c,
-        {{c.json, OUTPUT_KIND::Json}, {c.csv, OUTPUT_KIND::Text}, {c.sheet, OUTPUT_KIND::Sheet}},
-        doc,
-        [&](std::vector<T_SECTION_PAIR>&) {
-            return ReadForces(c, doc.Unit().Units(), request.forces);
-        },
-        [&](std::size_t, const T_SECT_D& section, const T_MATL_D& material, std::string& why) {
-            return CheckSection(section, material, request, doc.Unit().Units(),
-                                checks.emplace_back(), why);
+        c, {{c.json, OUTPUT_KIND::Json}, {c.csv, OUTPUT_KIND::Text}, {c.sheet, OUTPUT_KIND::Sheet}},
+        doc, [&](std::vector<T_SECTION_PAIR>& pairs) { return ReadJobs(c, doc, pairs, jobs); },
+        [&](std::size_t i, const T_SECT_D& section, const T_MATL_D& material, std::string& why) {
+            request.forces = std::move(jobs[i].forces);
+            T_SECTION_CHECK& check = checks.emplace_back();
+            const int done =
+                CheckSection(section, material, request, doc.Unit().Units(), check, why);
+            if (done && c.byRatio) SortByRatio(check);
+            return done;
         });
     if (code != EXIT_CODE::Done) return code;
     const T_UNITS units = doc.Unit().Units();

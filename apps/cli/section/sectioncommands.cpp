@@ -149,8 +149,8 @@ T_SECTION_OPTIONS SectionOptionsOf(const T_SECTION_COMMAND& c)
     return o;
 }
 
-EXIT_CODE OverSections(const T_SECTION_COMMAND& c, const std::vector<T_OUTPUT>& outputs, CDBDoc& doc,
-                       const SECTION_PREPARE_FN& prepare, const SECTION_DO_FN& each)
+EXIT_CODE OverSections(const T_SECTION_COMMAND& c, const std::vector<T_OUTPUT>& outputs,
+                       CDBDoc& doc, const SECTION_PREPARE_FN& prepare, const SECTION_DO_FN& each)
 {
     if (const EXIT_CODE code = CheckOutputs(c.file, outputs, c.overwrite); code != EXIT_CODE::Done)
         return code;

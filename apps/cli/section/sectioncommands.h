@@ -2,6 +2,7 @@
 #pragma once
 
 #include "exitcodes.h"
+#include "qm_db/dbdoc.h"
 #include "qm_db/filectrl.h"
 #include "qm_rps/section/sectioncurves.h"
 

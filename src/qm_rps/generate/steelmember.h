@@ -34,3 +34,14 @@ ASCE_EDITION SteelEdition(const T_MEMBER_END& end);
 
 /// Plastic moment with an axial force of either sign: ASCE 41, or EN 1993-1-1 6.2.9.
 std::optional<double> SteelMoment(const T_STEEL_BASIS& in, double axial, CCodeSheet& sheet);
+
+/// Under a moment about y the section may buckle sideways: an I, a flat bar and what is given by
+/// values; round and hollow sections do not (EN 1993-1-1 6.3.2.1(2)).
+inline bool BucklesSideways(const T_SECT_D& section)
+{
+    const bool closed = section.shape == SECT_SHAPE::Circle || section.shape == SECT_SHAPE::Pipe ||
+                        section.shape == SECT_SHAPE::Box;
+    return !closed;
+}
+/// The message that it is not checked.
+inline constexpr const char* kNoSidewaysKey = "IDS_QM_WARN_SIDEWAYS";

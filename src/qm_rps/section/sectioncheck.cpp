@@ -2,6 +2,7 @@
 
 #include "qm_base/say.h"
 #include "qm_db/sectionproperties.h"
+#include "qm_rps/generate/steelmember.h"
 #include "qm_rps/section/sectionmodelof.h"
 #include "qm_rps/section/sectiontexts.h"
 #include "qm_rps/section/sectionways.h"
@@ -117,6 +118,17 @@ std::optional<double> T_CHECK_JOB::Moment(double direction, double axial, std::s
     return {};
 }
 
+void SortByRatio(T_SECTION_CHECK& check)
+{
+    const auto worst = [](const T_SECTION_CHECKS& set) {
+        double largest = -1.0;
+        for (const T_SECTION_WAY& way : set.ways)
+            largest = std::max(largest, way.ratio.value_or(-1.0));
+        return -largest;
+    };
+    std::ranges::stable_sort(check.sets, {}, worst);
+}
+
 int CheckSection(const T_SECT_D& section, const T_MATL_D& material,
                  const T_SECTION_CHECK_REQUEST& request, const T_UNITS& units, T_SECTION_CHECK& out,
                  std::string& reason)
@@ -149,6 +161,10 @@ int CheckSection(const T_SECT_D& section, const T_MATL_D& material,
     check.options = request.options;
     check.ofConcrete = material.type == MATL_CLASS::Concrete;
     check.trace = sheet.Trace(), check.warnings = sheet.Warnings();
+    const bool bentAboutY =
+        std::ranges::any_of(request.forces, [](const T_SECTION_FORCES& f) { return f.My != 0.0; });
+    if (!check.ofConcrete && bentAboutY && BucklesSideways(section))
+        check.warnings.push_back({kNoSidewaysKey, {}});
     for (const T_SECTION_FORCES& forces : request.forces)
         check.sets.push_back(Checked(job, check.ofConcrete, forces));
     out = std::move(check);

@@ -9,6 +9,7 @@
 struct T_SECTION_FORCES {
     double N = 0.0, My = 0.0, Mz = 0.0;
     double Vy = 0.0, Vz = 0.0, T = 0.0; // shear along y and z, torsion
+    std::string name{};                 // of the set; empty: none
     bool operator==(const T_SECTION_FORCES&) const = default;
 };
 struct T_SECTION_FORCE {
@@ -61,6 +62,8 @@ struct T_SECTION_CHECK {
     std::vector<T_CODE_WARNING> warnings;
     std::vector<T_SECTION_CHECKS> sets;
 };
+/// The set with the largest ratio first; those in which nothing was checked last.
+void SortByRatio(T_SECTION_CHECK& check);
 
 /// The section calculator gives the ratio of the axial force to the strength without moments, and
 /// of the moment to the one that the section carries at this axial force in its direction: exact.

@@ -46,16 +46,29 @@ T_TEXT_TABLE SectionWaysTable(const std::vector<T_SECTION_WAY>& ways)
     return t;
 }
 
+T_TEXT_TABLE SectionSetsTable(const T_SECTION_CHECK& check)
+{
+    T_TEXT_TABLE t = SectionWaysTable({});
+    t.columns.insert(t.columns.begin(), {Say("IDS_QM_SECK_HEAD_SET")});
+    for (const T_SECTION_CHECKS& set : check.sets)
+        for (std::vector<std::string>& way : SectionWaysTable(set.ways).rows) {
+            way.insert(way.begin(), set.forces.name);
+            t.rows.push_back(std::move(way));
+        }
+    return t;
+}
+
 T_TEXT_TABLE SectionCheckTable(const T_SECTION_CHECK& check, const T_UNITS& units)
 {
     T_TEXT_TABLE t;
+    t.columns.push_back({Say("IDS_QM_SECK_HEAD_SET")});
     for (const T_SECTION_FORCE& force : kSectionForces)
         t.columns.push_back({HeadWithUnit(force.name, force.dim, units), true});
     const std::vector<T_TEXT_COLUMN> heads = SectionWaysTable({}).columns;
     t.columns.insert(t.columns.end(), heads.begin(), heads.end());
     for (const T_SECTION_CHECKS& set : check.sets)
         for (const std::vector<std::string>& way : SectionWaysTable(set.ways).rows) {
-            std::vector<std::string>& row = t.rows.emplace_back();
+            std::vector<std::string>& row = t.rows.emplace_back(1, set.forces.name);
             for (const T_SECTION_FORCE& force : kSectionForces)
                 row.push_back(
                     FormatText("%.6g", FromSi(set.forces.*force.value, units, force.dim) + 0.0));
@@ -83,12 +96,9 @@ std::vector<std::string> SectionCheckHead(const T_SECTION_CHECK& check, const T_
 std::vector<std::string> SectionCheckTrace(const T_SECTION_CHECK& check, const T_UNITS& units)
 {
     std::vector<std::string> lines;
-    std::size_t number = 0;
     for (const T_SECTION_CHECKS& set : check.sets) {
-        ++number;
         for (const T_SECTION_WAY& way : set.ways) {
-            lines.push_back(
-                Say("IDS_QM_SECK_TRACE", std::to_string(number), WhatText(way), ByText(way)));
+            lines.push_back(Say("IDS_QM_SECK_TRACE", set.forces.name, WhatText(way), ByText(way)));
             if (!way.ratio) lines.push_back("  " + VerdictText(way));
             for (const T_CODE_TRACE& line : way.trace)
                 lines.push_back("  " + TraceLine(line, units));

@@ -8,7 +8,10 @@
 /// each way.
 T_TEXT_TABLE SectionWaysTable(const std::vector<T_SECTION_WAY>& ways);
 
-/// Forces, then the table of the ways; a row for each way of each set of forces.
+/// The name of the set, then the table of the ways; a row for each way of each set.
+T_TEXT_TABLE SectionSetsTable(const T_SECTION_CHECK& check);
+
+/// The name of the set, its forces, then the table of the ways; rows as above.
 T_TEXT_TABLE SectionCheckTable(const T_SECTION_CHECK& check, const T_UNITS& units);
 
 /// The section with its strengths and warnings, a line each; then what the ways warn of.

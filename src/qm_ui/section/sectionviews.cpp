@@ -98,16 +98,44 @@ void AddPage(CFormView& form, DLG& d, SECTION_TASK task, const char* title)
         name + ".export";
 }
 
+T_GRID_BINDING SetGrid(DLG& d)
+{
+    T_GRID_BINDING b;
+    for (std::size_t c = 0; c < DLG::kSetColumns; ++c)
+        b.columns.push_back(
+            {[&d, c] { return d.SetHead(c); }, c == 0 ? CELL_KIND::Text : CELL_KIND::Number, true});
+    b.rows = [&d] { return d.m_sets.size(); };
+    b.text = [&d](std::size_t row, std::size_t c) { return d.SetText(row, c); };
+    b.set = [&d](std::size_t row, std::size_t c, const std::string& text) {
+        return d.SetCell(row, c, text);
+    };
+    b.select = [&d](int row) { d.m_set = row; };
+    b.selected = [&d] { return d.m_set; };
+    return b;
+}
+
 void AddForces(CFormView& form, DLG& d)
 {
-    std::vector<TextFn> heads;
-    for (const T_SECTION_FORCE& force : kSectionForces)
-        heads.push_back([&d, &force] { return HeadWithUnit(force.name, force.dim, d.Units()); });
-    form.Cells(heads);
-    for (std::size_t i = 0; i < heads.size(); ++i)
-        form.Number(heads[i], Member(d, d.m_forces.*kSectionForces[i].value)).name =
-            std::string("check.") + kSectionForces[i].name;
-    form.EndCells();
+    CFormField& sets = form.Grid(SetGrid(d));
+    sets.name = "check.sets";
+    sets.widget->setMinimumHeight(90);
+    sets.widget->setMaximumHeight(150);
+    form.Columns();
+    const auto button = [&form](const char* key, const std::function<void()>& pressed) {
+        form.Button(KeyText(key), pressed).name = key;
+        form.NextColumn();
+    };
+    button("IDS_QM_UI_SECK_NEW", [&d] { d.OnNewSet(); });
+    button("IDS_QM_UI_SECK_DELETE", [&d] { d.OnDeleteSet(); });
+    button("IDS_QM_UI_SECK_READ", [&d] { (void)d.OnReadSets(); });
+    form.Choice(KeyText("IDS_QM_UI_SECK_CASE"), Ref(d.m_loadCase), [&d] { return d.LoadCases(); })
+        .name = "check.case";
+    form.NextColumn();
+    form.Text(KeyText("IDS_QM_UI_SECK_ELEMENTS"), Ref(d.m_elements)).name = "check.elements";
+    form.NextColumn();
+    form.Button(KeyText("IDS_QM_UI_SECK_TAKE"), [&d] { (void)d.OnTakeResults(); }).name =
+        "IDS_QM_UI_SECK_TAKE";
+    form.EndColumns();
     form.Columns();
     form.Choice(KeyText("IDS_QM_UI_SECK_CODE"), Member(d, d.m_checkCode),
                 [] {
@@ -121,6 +149,8 @@ void AddForces(CFormView& form, DLG& d)
     CFormField& cot = form.Number(KeyText("IDS_QM_UI_SECK_COT"), Member(d, d.m_cotTheta));
     cot.name = "check.cotTheta";
     cot.shown = [&d] { return d.IsConcrete(); };
+    form.NextColumn();
+    form.Flag(KeyText("IDS_QM_UI_SECK_BY_RATIO"), Member(d, d.m_byRatio)).name = "check.byRatio";
     form.EndColumns();
 }
 

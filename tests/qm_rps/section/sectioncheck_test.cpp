@@ -110,15 +110,22 @@ TEST(SectionCheck, SteelByEveryWay)
     for (const auto& row : kRows)
         EXPECT_NEAR(row.ratio, Ratio(check, row.what, row.by), 1e-8) << row.by;
     EXPECT_EQ(std::size(kRows) + 1, check.sets.front().ways.size()); // and exact bending
+    const auto tellsSideways = [](const T_SECTION_CHECK& c) {
+        const T_CODE_WARNING warning{"IDS_QM_WARN_SIDEWAYS", {}};
+        return std::ranges::count(c.warnings, warning) > 0;
+    };
+    EXPECT_TRUE(tellsSideways(check));
+    const T_SECTION_CHECK weak = Checked(PlatedI(), Steel(), {{}, {}, 1.0, {{0, 0, 30e3}}});
+    EXPECT_FALSE(tellsSideways(weak)); // about the weak axis
     const T_SECTION_CHECK one =
         Checked(PlatedI(), Steel(), {{}, {}, 1.0, {{800e3, 200e3, 0.0, 0.0, 0.0, 0.0}}});
     EXPECT_NEAR(0.5234469537, Ratio(one, Bending, ""), 1e-8);
     const T_TEXT_TABLE table = SectionCheckTable(check, kSi);
     const auto aisc =
-        std::ranges::find(table.rows, "AISC 360 H1-1", [](const auto& r) { return r[7]; });
+        std::ranges::find(table.rows, "AISC 360 H1-1", [](const auto& r) { return r[8]; });
     ASSERT_NE(table.rows.end(), aisc);
-    EXPECT_EQ("1.001", (*aisc)[8]);
-    EXPECT_EQ("EXCEEDED", (*aisc)[9]);
+    EXPECT_EQ("1.001", (*aisc)[9]);
+    EXPECT_EQ("EXCEEDED", (*aisc)[10]);
 }
 
 // k 1.66519, rho_l 0.0069504, d 0.452 m: VRd,c 145.952 kN above VRd,s 276.048 (cot 1); design with
