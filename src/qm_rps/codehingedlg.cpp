@@ -115,6 +115,15 @@ void CCodeHingeDlg::Take(T_CODE_HINGES hinges)
     OnType(m_firsts.empty() ? -1 : 0);
 }
 
+/// Hinges without a push are there at once.
+int CCodeHingeDlg::WithProgress(const std::function<int(const PUSH_PROGRESS_FN&)>& work) const
+{
+    if (m_options.PushedCase() == 0 || !m_withProgress) return work({});
+    return m_withProgress([&](TELL_FN tell) {
+        return work([&tell](const T_PUSH_PROGRESS& at) { return tell(at.done, at.total); });
+    });
+}
+
 int CCodeHingeDlg::OnPreview()
 {
     if (m_elements.empty()) return 0;
@@ -122,7 +131,9 @@ int CCodeHingeDlg::OnPreview()
     T_CODE_HINGES hinges;
     T_HINGE_REFUSAL refusal;
     if (!m_options.Read(Chosen(), request, refusal.text) ||
-        !m_options.Preview(request, hinges, refusal)) {
+        !WithProgress([&](const PUSH_PROGRESS_FN& progress) {
+            return m_options.Preview(request, progress, hinges, refusal);
+        })) {
         Forget();
         m_status = Say("IDS_QM_UI_GEN_NO_HINGES", refusal.text);
         return 0;
@@ -263,7 +274,9 @@ int CCodeHingeDlg::OnApply()
     T_CODE_HINGES hinges;
     T_HINGE_REFUSAL refusal;
     if (!m_options.Read(Chosen(), request, refusal.text) ||
-        !m_options.Generate(request, hinges, refusal))
+        !WithProgress([&](const PUSH_PROGRESS_FN& progress) {
+            return m_options.Generate(request, progress, hinges, refusal);
+        }))
         return Refuse(refusal);
     Take(std::move(hinges));
     m_status = Say("IDS_QM_GEN_DONE", std::to_string(m_hinges.elements.size()),

@@ -166,7 +166,7 @@ EXIT_CODE RunHingeGenerate(const T_HINGE_GENERATE_OPTIONS& o)
     CCodeHinges generator(doc);
     if (!(o.stale         ? generator.Regenerate(hinges, refusal)
           : loadCase == 0 ? generator.Generate(request, hinges, refusal)
-                          : generator.GenerateFromPush(request, loadCase, hinges, refusal)))
+                          : generator.GenerateFromPush(request, loadCase, {}, hinges, refusal)))
         return Complain(EXIT_CODE::BadInput, o.file + ": " + refusal.text);
     const T_UNITS units = doc.Unit().Units();
     if (o.json != "-") {

@@ -185,27 +185,28 @@ int CCodeHingeOptions::Read(std::vector<int> elements, T_CODE_REQUEST& out,
     return 1;
 }
 
-int CCodeHingeOptions::Make(CDBDoc& doc, const T_CODE_REQUEST& request, T_CODE_HINGES& out,
+int CCodeHingeOptions::Make(CDBDoc& doc, const T_CODE_REQUEST& request,
+                            const PUSH_PROGRESS_FN& progress, T_CODE_HINGES& out,
                             T_HINGE_REFUSAL& refusal) const
 {
     CCodeHinges generator(doc);
     const int pushed = PushedCase();
     return pushed == 0 ? generator.Generate(request, out, refusal)
-                       : generator.GenerateFromPush(request, pushed, out, refusal);
+                       : generator.GenerateFromPush(request, pushed, progress, out, refusal);
 }
 
-int CCodeHingeOptions::Generate(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
-                                T_HINGE_REFUSAL& refusal) const
+int CCodeHingeOptions::Generate(const T_CODE_REQUEST& request, const PUSH_PROGRESS_FN& progress,
+                                T_CODE_HINGES& out, T_HINGE_REFUSAL& refusal) const
 {
-    return Make(m_doc, request, out, refusal);
+    return Make(m_doc, request, progress, out, refusal);
 }
 
-int CCodeHingeOptions::Preview(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
-                               T_HINGE_REFUSAL& refusal) const
+int CCodeHingeOptions::Preview(const T_CODE_REQUEST& request, const PUSH_PROGRESS_FN& progress,
+                               T_CODE_HINGES& out, T_HINGE_REFUSAL& refusal) const
 {
     if (PushedCase() == 0) return CCodeHinges(m_doc).Preview(request, out, refusal);
     CTrial trial(m_doc); // what is pushed are hinges that are there
-    return Make(trial.Doc(), request, out, refusal);
+    return Make(trial.Doc(), request, progress, out, refusal);
 }
 
 std::string CodeIterationsText(const T_CODE_HINGES& hinges, const T_UNITS& units)

@@ -56,20 +56,21 @@ public:
     /// As the generator takes it. 1 done; 0 with the reason, `out` as it was.
     [[nodiscard]] int Read(std::vector<int> elements, T_CODE_REQUEST& out,
                            std::string& reason) const;
-    /// The hinges themselves, in the document, by a push if one is asked for. 0 as CCodeHinges.
-    [[nodiscard]] int Generate(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
-                               T_HINGE_REFUSAL& refusal) const;
+    /// The hinges themselves, in the document, by a push if one is asked for, which is told to
+    /// `progress`. 0 as CCodeHinges.
+    [[nodiscard]] int Generate(const T_CODE_REQUEST& request, const PUSH_PROGRESS_FN& progress,
+                               T_CODE_HINGES& out, T_HINGE_REFUSAL& refusal) const;
     /// The same without a change of the document.
-    [[nodiscard]] int Preview(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
-                              T_HINGE_REFUSAL& refusal) const;
+    [[nodiscard]] int Preview(const T_CODE_REQUEST& request, const PUSH_PROGRESS_FN& progress,
+                              T_CODE_HINGES& out, T_HINGE_REFUSAL& refusal) const;
 
     T_UNITS Units() const { return m_doc.Data().Units(); }
 
 private:
     int ReadConnection(T_CODE_REQUEST& request, std::string& reason) const;
     void TakeConnection(const std::optional<T_STEEL_CONNECTION>& connection);
-    int Make(CDBDoc& doc, const T_CODE_REQUEST& request, T_CODE_HINGES& out,
-             T_HINGE_REFUSAL& refusal) const;
+    int Make(CDBDoc& doc, const T_CODE_REQUEST& request, const PUSH_PROGRESS_FN& progress,
+             T_CODE_HINGES& out, T_HINGE_REFUSAL& refusal) const;
     CDBDoc& m_doc;
     std::map<int, std::vector<double>> m_pushed; // of the stale types that were taken
 };

@@ -231,7 +231,8 @@ int CCodeHinges::Generate(const T_CODE_REQUEST& request, T_CODE_HINGES& out,
     return 1;
 }
 
-int CCodeHinges::GenerateFromPush(T_CODE_REQUEST request, int loadCase, T_CODE_HINGES& out,
+int CCodeHinges::GenerateFromPush(T_CODE_REQUEST request, int loadCase,
+                                  const PUSH_PROGRESS_FN& progress, T_CODE_HINGES& out,
                                   T_HINGE_REFUSAL& refusal)
 {
     CEditScope edit(m_doc, "hinges of a code by a push"); // undone as one
@@ -247,8 +248,9 @@ int CCodeHinges::GenerateFromPush(T_CODE_REQUEST request, int loadCase, T_CODE_H
         std::string error;
         CPushRun push(m_doc);
         push.TellForces([&shears](const T_STEP_FORCES& step) { shears.Take(step); });
-        if (!push.Run(loadCase, {}, runs, error)) {
-            refusal = RefusalOf(0, error);
+        const int done = push.Run(loadCase, progress, runs, error);
+        if (!done || runs.back().cancelled) {
+            refusal = RefusalOf(0, done ? Say("IDS_QM_PUSH_END_CANCELLED") : error);
             return 0;
         }
         auto now = shears.Values();

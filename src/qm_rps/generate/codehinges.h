@@ -62,8 +62,10 @@ public:
     /// Generates, pushes a load case and generates again with the shear of the push (CPushedShears)
     /// until no V changes by kSameShear of itself, at most kMostPushes times; each push is told.
     /// What the push could not settle is said as a warning. 1 done; 0 with the refusal, also where
-    /// the load case can't be pushed, the document unchanged.
-    [[nodiscard]] int GenerateFromPush(T_CODE_REQUEST request, int loadCase, T_CODE_HINGES& out,
+    /// the load case can't be pushed or `progress`, told the steps of each push, asks to stop; the
+    /// document unchanged.
+    [[nodiscard]] int GenerateFromPush(T_CODE_REQUEST request, int loadCase,
+                                       const PUSH_PROGRESS_FN& progress, T_CODE_HINGES& out,
                                        T_HINGE_REFUSAL& refusal);
     static constexpr double kSameShear = 0.01;
     static constexpr int kMostPushes = 8;
