@@ -212,6 +212,8 @@ void CheckSteel(const T_CHECKING& c)
 {
     CheckRotation(c);
     (void)CheckShear(c);
+    if (c.end.member.aboutY && BucklesSideways(c.end.member.section))
+        c.out.warnings.push_back({kNoSidewaysKey, {}});
     if (!c.out.Of(Axial)) return;
     const bool withMoments = CountsOnNoRotation(c);
     if (CheckAxial(c, withMoments) && withMoments)
