@@ -63,6 +63,21 @@ double Factor(const T_FR_CONNECTION& c, CCodeSheet& sheet)
 
 } // namespace
 
+double AscePanelStrength(const T_STEEL_JOINT& j, CCodeSheet& sheet)
+{
+    return sheet.Put("Vye", 0.55 * j.columnFye * j.columnDepth * j.columnWeb, kDimForce, kFactors,
+                     "0.55 Fye dc tcw", R);
+}
+
+double AscePanelShear(double moment, double depth, double columnShear, CCodeSheet& sheet)
+{
+    constexpr double kLever = 0.95; // of the beam's depth, between its flanges
+    sheet.Put("sum M", std::fabs(moment), kDimMoment, kFactors, "of the beams' ends", R);
+    sheet.Put("Vc", std::fabs(columnShear), kDimForce, kFactors, "of the column above", R);
+    return sheet.Put("Vpz", std::fabs(moment / (kLever * depth) - columnShear), kDimForce, kFactors,
+                     "sum M/(0.95 d) - Vc", R);
+}
+
 std::optional<double> AscePanelRatio(const T_STEEL_JOINT& j, double depth, CCodeSheet& sheet)
 {
     sheet.Positive({{"columnDepth", j.columnDepth}, {"columnWeb", j.columnWeb}});
@@ -71,9 +86,8 @@ std::optional<double> AscePanelRatio(const T_STEEL_JOINT& j, double depth, CCode
     sheet.Put("sum M", j.beams, kDimMoment, kFactors, "Z Fye L/(L - dc) of the beams", R);
     const double shear = sheet.Put("Vpz", j.beams / depth * (j.storey - depth) / j.storey,
                                    kDimForce, kFactors, "sum M/d (h - d)/h", R);
-    const double yield = sheet.Put("Vye", 0.55 * j.columnFye * j.columnDepth * j.columnWeb,
-                                   kDimForce, kFactors, "0.55 Fye dc tcw", R);
-    return sheet.Put("Vpz/Vye", shear / yield, kFactors, "", CODE_MARK::Computed);
+    return sheet.Put("Vpz/Vye", shear / AscePanelStrength(j, sheet), kFactors, "",
+                     CODE_MARK::Computed);
 }
 
 std::optional<T_CODE_PLASTIC> AsceConnection(const T_FR_CONNECTION& c, CCodeSheet& sheet)

@@ -30,10 +30,16 @@ struct T_STEEL_JOINT {
     double columnFlange = 0.0;                 // thickness; 0: there is no column that is read
     double columnDepth = 0.0, columnWeb = 0.0; // m
     double columnFye = 0.0;                    // Pa
+    double columnArea = 0.0;                   // m2
     double storey = 0.0;                       // mean length of the columns above and below, m
     double beams = 0.0;                        // sum of M L/(L - dc) of the beams, N m
     bool operator==(const T_STEEL_JOINT&) const = default;
 };
+/// Vye of a panel zone: 0.55 Fye dc tcw, the web of the column alone.
+double AscePanelStrength(const T_STEEL_JOINT& joint, CCodeSheet& sheet);
+/// Shear of a panel zone under the moments of its beams (depth `depth`) and the shear of the column
+/// above it.
+double AscePanelShear(double moment, double depth, double columnShear, CCodeSheet& sheet);
 /// Vpz / Vye of ASCE 41-17 9.4.2.4.3: shear of the panel zone when the beams of depth `depth`
 /// yield, over 0.55 Fye dc tcw.
 std::optional<double> AscePanelRatio(const T_STEEL_JOINT& joint, double depth, CCodeSheet& sheet);

@@ -5,6 +5,7 @@
 #include "qm_rps/generate/steelmember.h"
 #include "qm_rps/push/pushstoreys.h"
 
+#include <algorithm>
 #include <cmath>
 #include <numeric>
 
@@ -82,6 +83,7 @@ void AddColumn(const T_NEIGHBOUR& n, int& count, T_STEEL_JOINT& joint)
     joint.columnDepth = depth;
     joint.columnWeb = web;
     joint.columnFye = n.fy;
+    joint.columnArea = n.section.area;
 }
 
 std::optional<T_STEEL_JOINT> JointAt(const T_MODEL& model, int node, const T_VECTOR& beam)
@@ -102,6 +104,28 @@ std::optional<T_STEEL_JOINT> JointAt(const T_MODEL& model, int node, const T_VEC
 }
 
 } // namespace
+
+int ReadPanelZone(const T_MODEL& model, int node, const std::array<double, 3>& along,
+                  std::span<const int> beams, T_PANEL_ZONE& out, std::string& reason)
+{
+    const std::optional<T_STEEL_JOINT> joint = JointAt(model, node, along);
+    if (!joint) {
+        reason = Say("IDS_QM_JUDGE_PANEL_COLUMN");
+        return 0;
+    }
+    T_PANEL_ZONE zone{*joint, 0.0};
+    for (const int id : beams) {
+        const auto beam = NeighbourOf(model, model.elements.at(id), node);
+        if (!beam) {
+            reason = Say("IDS_QM_JUDGE_PANEL_BEAM", std::to_string(id));
+            return 0;
+        }
+        const double depth = beam->section.size[0];
+        zone.depth = zone.depth > 0.0 ? std::min(zone.depth, depth) : depth;
+    }
+    out = zone;
+    return 1;
+}
 
 int ReadSteelJoints(const T_MODEL& model, const T_STEEL_CONNECTION& asked, T_HINGE_MEMBER& member,
                     std::string& reason)

@@ -83,9 +83,8 @@ public:
         for (const JUDGE_MODE mode : ModesOf(m_ends[end]))
             for (std::size_t k = 0; k < out.size(); ++k)
                 if (out[k].mode == mode) m_modes[k] = true;
+        m_missing.assign(out.size(), false);
         T_RATIOS from = At(0);
-        for (std::size_t k = 0; k < out.size(); ++k)
-            if (m_modes[k] && from.at[k] < 0.0) ++out[k].unchecked;
         Take(from);
         const std::size_t last = m_path.displacement.size() - 1;
         for (const std::size_t to : {std::min(m_peak, last), last}) {
@@ -95,6 +94,8 @@ public:
             Visit(from, until);
             from = until;
         }
+        for (std::size_t k = 0; k < out.size(); ++k)
+            if (m_missing[k]) ++out[k].unchecked;
     }
 
     std::vector<T_FIRST_PASS> out;
@@ -105,7 +106,7 @@ private:
         return {m_ends[m_end], m_path, m_end, from, m_peak, m_factors};
     }
 
-    T_RATIOS At(std::size_t index) const
+    T_RATIOS At(std::size_t index)
     {
         const T_END_CHECKS checks = Piece(index).At(0.0);
         T_RATIOS r{index, std::vector<double>(out.size(), -1.0)};
@@ -113,6 +114,8 @@ private:
             if (const auto check = checks.At(out[k].mode, out[k].level))
                 r.at[k] =
                     check->Holds() ? check->Ratio().value_or(0.0) : check->Ratio().value_or(kNever);
+            else if (m_modes[k])
+                m_missing[k] = true;
         return r;
     }
 
@@ -158,9 +161,7 @@ private:
     {
         constexpr double kBeyond = 0.01; // of the larger one
         const T_END_STATE &a = m_path.ends[from][m_end], &b = m_path.ends[to][m_end];
-        for (double T_END_STATE::*m :
-             {&T_END_STATE::N, &T_END_STATE::M, &T_END_STATE::V, &T_END_STATE::across,
-              &T_END_STATE::chord, &T_END_STATE::flowed, &T_END_STATE::hingeMoment}) {
+        for (double T_END_STATE::*m : kEndStateMembers) {
             const double beyond = kBeyond * std::max(std::fabs(a.*m), std::fabs(b.*m));
             const double low = std::min(a.*m, b.*m) - beyond, high = std::max(a.*m, b.*m) + beyond;
             for (std::size_t i = from + 1; i < to; ++i) {
@@ -198,6 +199,7 @@ private:
     std::size_t m_peak = 0, m_end = 0;
     std::vector<double> m_place; // of the first passes so far: state and share of the way behind it
     std::vector<bool> m_modes;   // limits of modes that the end has
+    std::vector<bool> m_missing; // those of them that some state has no numbers for
 };
 
 } // namespace

@@ -25,10 +25,43 @@ void Reduce(T_JOINT& joint, double gammaC)
     joint.trace.insert(joint.trace.end(), sheet.Trace().begin(), sheet.Trace().end());
 }
 
+/// Deformation-controlled: up to its yield strength a panel zone passes every limit; beyond, its
+/// rotation would have to be known, and the model's joints are rigid.
+void CheckPanelOf(const T_CHECKING& c, const T_PANEL_ZONE& zone)
+{
+    constexpr double kMostAxial = 0.4; // of Pye: the strength holds up to there (AISC 360 J10.6)
+    T_MODE_CHECK& check = c.Of(JUDGE_MODE::Joint);
+    const T_END_STATE& s = c.state;
+    check.dim = kDimForce;
+    CCodeSheet sheet;
+    sheet.Positive({{"columnDepth", zone.joint.columnDepth}, {"columnWeb", zone.joint.columnWeb}});
+    sheet.Positive({{"columnFye", zone.joint.columnFye}, {"depth", zone.depth}});
+    const double shear = AscePanelShear(s.M, zone.depth, s.V, sheet);
+    const double yield = AscePanelStrength(zone.joint, sheet);
+    const double axial =
+        sheet.Put("P/Pye", std::fabs(s.N) / (zone.joint.columnArea * zone.joint.columnFye),
+                  "AISC 360 J10.6", "of the column above", R);
+    const double ratio = sheet.Put("Vpz/Vye", shear / yield, "ASCE 41-17 9.4.2.4.3", "", R);
+    if (!sheet.Sound()) {
+        check.why = FaultText(*sheet.Fault());
+        return;
+    }
+    sheet.Warn("IDS_QM_JUDGE_WARN_PANEL", {});
+    Keep(sheet, check, c.out);
+    check.clause.fill(ClauseOf(check.trace, {"Vye"}));
+    if (axial > kMostAxial)
+        check.why = Say("IDS_QM_JUDGE_PANEL_AXIAL", CodeNumber(axial));
+    else if (ratio > 1.0)
+        check.why = Say("IDS_QM_JUDGE_PANEL_YIELDS", CodeNumber(ratio));
+    else
+        check.at.fill(T_CHECK{shear, yield});
+}
+
 } // namespace
 
 void CheckJointOf(const T_CHECKING& c)
 {
+    if (c.end.joint->panel) return CheckPanelOf(c, *c.end.joint->panel);
     T_MODE_CHECK& check = c.Of(JUDGE_MODE::Joint);
     const T_END_STATE& s = c.with.brittle;
     T_JOINT joint = c.end.joint->joint;

@@ -290,14 +290,29 @@ private:
         const bool hasParts = Place(members, *joint);
         if (!code)
             end.why = Say("IDS_QM_JUDGE_NO_DATA");
-        else if (isKnown && material->second.type == MATL_CLASS::Steel)
-            end.why = Say("IDS_QM_JUDGE_PANEL_ZONE");
         else if (!hasParts)
             end.why = Say("IDS_QM_GEN_CLEAR");
+        else if (isKnown && material->second.type == MATL_CLASS::Steel)
+            AddPanel(node, *code, members, *joint, end);
         else if (ReadJoint(m_model, around, node, along, *code, joint->joint, end.why) != 0)
             end.basis = JUDGE_BASIS::Code;
         end.joint = std::move(joint);
         m_out.push_back(std::move(end));
+    }
+
+    /// A panel zone of steel, which ASCE 41 and FEMA 356 have a strength for.
+    void AddPanel(int node, HINGE_CODE code, const T_JOINT_MEMBERS& members, T_JUDGED_JOINT& joint,
+                  T_JUDGED_END& end) const
+    {
+        if (IsChordCode(code)) {
+            end.why = Say("IDS_QM_JUDGE_PANEL_ZONE");
+            return;
+        }
+        T_PANEL_ZONE zone;
+        if (!ReadPanelZone(m_model, node, joint.forth, members.beams, zone, end.why)) return;
+        joint.joint.code = code;
+        joint.panel = zone;
+        end.basis = JUDGE_BASIS::Code;
     }
 
     /// That of the column, else of the first beam that has one.

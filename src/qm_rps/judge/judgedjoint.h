@@ -2,6 +2,7 @@
 #pragma once
 
 #include "qm_rps/generate/jointcheck.h"
+#include "qm_rps/generate/steeljoint.h"
 #include "qm_rps/judge/endstate.h"
 
 /// A joint in the plane of the vertical and a horizontal axis.
@@ -16,8 +17,9 @@ struct T_JUDGED_JOINT {
     std::size_t along = 0;               // 0: X, 1: Y, 2: Z
     std::array<double, 3> forth{}, up{}; // unit vectors, global
     std::vector<T_PART> beams;
-    std::optional<T_PART> above; // column
-    T_JOINT joint;               // its code alone where it can't be judged
+    std::optional<T_PART> above;       // column
+    T_JOINT joint;                     // its code alone where it can't be judged, and of steel
+    std::optional<T_PANEL_ZONE> panel; // of steel
 };
 
 /// M: the beams' moments on the joint that push its top forth; V: the force of the column above on

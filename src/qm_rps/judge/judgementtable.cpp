@@ -92,6 +92,12 @@ void PutCheck(const T_MODE_CHECK& mode, std::size_t level, const T_UNITS& units,
     if (other) to.Text(C::OtherUnit, UnitText(mode.dim, units));
 }
 
+/// What a row calls a mode of its end.
+std::string ModeOf(const T_JUDGED_END& end, JUDGE_MODE mode)
+{
+    return end.joint && end.joint->panel ? Say("IDS_QM_JUDGE_PANEL") : ModeText(mode);
+}
+
 /// Why a check is missing, by mode; those alike: once.
 std::string ReasonOf(const T_END_CHECKS& checks)
 {
@@ -229,7 +235,7 @@ T_JUDGED_CELLS CellsOf(const T_JUDGEMENT& judgement, const T_JUDGED_STATE& state
         any = any || check.at[state.level];
     }
     if (any) {
-        to.Text(C::Governing, ModeText(row.governing));
+        to.Text(C::Governing, ModeOf(end, row.governing));
         to.Text(C::Clause, row.checks.Of(row.governing)->clause[state.level]);
     }
     to.Text(C::Verdict, VerdictText(row.verdict));

@@ -5,6 +5,7 @@
 
 #include <cmath>
 #include <numbers>
+#include <tuple>
 
 namespace {
 
@@ -64,7 +65,49 @@ T_END_CHECKS Checked(const T_JUDGED_END& end, double N, double V, double chord)
     return CheckEnd(end, s, with);
 }
 
+/// A panel zone of an HEB 200 without fillets under beams 300 mm deep, Fye 303 MPa.
+T_END_CHECKS PanelUnder(double moment, double axial)
+{
+    auto joint = std::make_shared<T_JUDGED_JOINT>();
+    T_PANEL_ZONE zone;
+    zone.joint.columnDepth = 0.2, zone.joint.columnWeb = 0.009, zone.joint.columnFye = 303e6;
+    zone.joint.columnArea = 0.00753;
+    zone.depth = 0.3;
+    joint->panel = zone;
+    T_JUDGED_END end;
+    end.kind = JUDGED_KIND::Joint;
+    end.basis = JUDGE_BASIS::Code;
+    end.joint = joint;
+    T_END_STATE s;
+    s.M = moment, s.V = 30 * kN, s.N = axial;
+    T_STATE_CONTEXT with;
+    with.brittle = s;
+    return CheckEnd(end, s, with);
+}
+
 } // namespace
+
+// Vye = 0.55 303e6 0.2 0.009 = 299.97 kN; Vpz = M/(0.95 0.3) - 30. Beyond Vye the rotation would
+// have to be known; P/Pye = 0.4 at 912.6 kN.
+TEST(JudgedMaterials, PanelZonesPassUpToTheirYieldStrength)
+{
+    const T_END_CHECKS holds = PanelUnder(80 * kN, 100 * kN);
+    for (std::size_t level = 0; level < kLevels; ++level) {
+        const auto check = holds.At(JUDGE_MODE::Joint, level);
+        ASSERT_TRUE(check);
+        EXPECT_NEAR((80 / 0.285 - 30) * kN, check->demand, 1e-6);
+        EXPECT_NEAR(299.97 * kN, check->capacity, 1e-6);
+    }
+    // The other way the shear above adds: (80/0.285 + 30)/299.97 = 1.036.
+    for (const auto& [moment, axial, says] : {std::tuple{-80 * kN, 0.0, "Vpz/Vye = 1.036"},
+                                              {100 * kN, 0.0, "Vpz/Vye = 1.07"},
+                                              {80 * kN, 920 * kN, "P/Pye = 0.4032"}}) {
+        const T_END_CHECKS checks = PanelUnder(moment, axial);
+        EXPECT_FALSE(checks.At(JUDGE_MODE::Joint, 2)) << says;
+        EXPECT_NE(std::string::npos, checks.Of(JUDGE_MODE::Joint)->why.find(says))
+            << checks.Of(JUDGE_MODE::Joint)->why;
+    }
+}
 
 // N = 300. Annex C: 83.8 in flexure, V = 0.065 fm/CF 0.4 3 (1 - 3 V/300) = 208/3.08 in sliding,
 // which comes first: drift 0.004. NTC: Mu/h0 = 83.5 comes first: 3/4 of 0.01; sliding 520/(0.7 1.2)
