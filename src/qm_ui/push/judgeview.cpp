@@ -32,24 +32,22 @@ private:
 void Build(CFormView& form, MODEL& d)
 {
     form.Note([&d] { return d.TitleText(); });
-    form.Columns();
+    // One below the other: beside each other their texts are cut in a narrow window.
     form.Choice(KeyText("IDS_QM_JUDGE_LIMIT_STATE"),
                 {[&d] { return d.StateIndex(); },
                  [&d](const int& index) { d.OnSelChangeState(index); }},
                 [&d] { return d.StateTexts(); })
         .name = "state";
-    form.NextColumn(1);
     form.Choice(
             KeyText("IDS_QM_UI_JUDGE_CODE"),
             {[&d] { return d.CodeIndex(); }, [&d](const int& index) { d.OnSelChangeCode(index); }},
             [&d] { return d.CodeTexts(); })
         .name = "code";
-    form.EndColumns();
     form.Note([&d] { return d.VerdictText(); });
     form.Note([&d] { return d.CountText(); });
     CFormField& frame = form.Custom({}, std::make_unique<CJudgedFrame>(d, form.Host()));
     frame.name = "frame";
-    frame.widget->setMinimumSize(480, 300);
+    frame.widget->setMinimumSize(420, 200);
     T_GRID_BINDING table = GridOf([&d] { return d.Table(); });
     table.tone = [&d](std::size_t row, std::size_t) {
         const VERDICT verdict = d.VerdictAt(row);
@@ -58,7 +56,7 @@ void Build(CFormView& form, MODEL& d)
     };
     CFormField& grid = form.Grid(std::move(table));
     grid.name = "ends";
-    grid.widget->setMinimumHeight(220);
+    grid.widget->setMinimumHeight(150);
     form.Button(KeyText("IDS_QM_UI_JUDGE_EXPORT"), [&d] { (void)d.OnExport(); }).name = "export";
     form.Note([&d] { return d.LimitsText(); });
     form.Note([&d] { return d.NotesText(); });
