@@ -23,10 +23,14 @@ double Area(const T_PIER& p)
     return p.length * p.thickness;
 }
 
-double ShapeFactor(const T_PIER& p, CCodeSheet& sheet)
+double ShapeFactor(double height, double length, CCodeSheet& sheet)
 {
-    return sheet.Put("b", std::clamp(p.height / p.length, 1.0, 1.5), kIrregular, "1 <= h/l <= 1.5",
-                     S1);
+    return sheet.Put("b", std::clamp(height / length, 1.0, 1.5), kIrregular, "1 <= h/l <= 1.5", S1);
+}
+
+double TensileStrength(double tau0, double confidence, CCodeSheet& sheet)
+{
+    return sheet.Put("ftd", 1.5 * tau0 / confidence, kDimStress, kIrregular, "1.5 tau0/CF", S1);
 }
 
 /// Sliding over the compressed length l' = 3 (l/2 - M/N) <= l with M = V h0, solved for V where
@@ -55,15 +59,15 @@ double SlidingStrength(const T_PIER& p, double limit, const char* clause, const 
 
 double IrregularStrength(const T_PIER& p, double stress, CCodeSheet& sheet)
 {
-    const double ftd =
-        sheet.Put("ftd", 1.5 * p.tau0 / p.confidence, kDimStress, kIrregular, "1.5 tau0/CF", S1);
-    return sheet.Put("Vt", Area(p) * ftd / ShapeFactor(p, sheet) * std::sqrt(1.0 + stress / ftd),
-                     kDimForce, kIrregular, "l t ftd/b sqrt(1 + s0/ftd)", S1);
+    const double ftd = TensileStrength(p.tau0, p.confidence, sheet);
+    const double b = ShapeFactor(p.height, p.length, sheet);
+    return sheet.Put("Vt", Area(p) * ftd / b * std::sqrt(1.0 + stress / ftd), kDimForce, kIrregular,
+                     "l t ftd/b sqrt(1 + s0/ftd)", S1);
 }
 
 double RegularStrength(const T_PIER& p, double stress, CCodeSheet& sheet)
 {
-    const double b = ShapeFactor(p, sheet);
+    const double b = ShapeFactor(p.height, p.length, sheet);
     const double loss = 1.0 + kJointFriction * p.interlocking;
     const double joints = (p.fv0 / p.confidence + kJointFriction * stress) / loss;
     double v = Area(p) / b * joints;
@@ -166,7 +170,7 @@ std::optional<T_SPANDREL_STRENGTH> NtcSpandrel(const T_SPANDREL& p, CCodeSheet& 
 {
     constexpr const char* kClause = "NTC 2018 7.8.2.2.4";
     sheet.Positive({{"depth", p.depth}, {"thickness", p.thickness}, {"length", p.length}});
-    sheet.Positive({{"tie", p.tie}, {"fm", p.fm}, {"fv0", p.fv0}});
+    sheet.Positive({{"tie", p.tie}, {"fm", p.fm}, {"tau0", p.tau0}});
     if (!sheet.Within("confidence", p.confidence, 1.0, 2.0)) return {};
     const double area = p.depth * p.thickness, fd = p.fm / p.confidence;
     const double force = sheet.Put("Hp", std::min(p.tie, 0.4 * fd * area), kDimForce, kClause,
@@ -174,8 +178,14 @@ std::optional<T_SPANDREL_STRENGTH> NtcSpandrel(const T_SPANDREL& p, CCodeSheet& 
     T_SPANDREL_STRENGTH s;
     s.moment = sheet.Put("Mu", force * p.depth / 2.0 * (1.0 - force / (0.85 * fd * area)),
                          kDimMoment, kClause, "Hp h/2 (1 - Hp/(0.85 fhd h t))", R);
-    s.shear = sheet.Put("Vt", area * p.fv0 / p.confidence, kDimForce, kClause, "h t fvd0", R);
-    s.drift = sheet.Put("theta_u", 0.015, kDrift, "spandrel with a tie 0.015", R);
+    // Of a spandrel the panel's length and height change places; its compression may be left out.
+    const double ftd = TensileStrength(p.tau0, p.confidence, sheet);
+    const double b = ShapeFactor(p.length, p.depth, sheet);
+    s.shear = sheet.Put("Vt", area * ftd / b, kDimForce, kIrregular, "h t ftd/b, s0 = 0", S1);
+    s.bendingDrift =
+        sheet.Put("theta_u", 0.02, kDrift, "bending, with an element that carries tension", S1);
+    s.shearDrift = sheet.Put("gamma_u", 0.005, kDrift, "diagonal cracks", S1);
+    sheet.Warn("IDS_QM_CODE_WARN_NO_LINTEL", {});
     return s;
 }
 

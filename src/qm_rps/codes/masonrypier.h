@@ -38,18 +38,18 @@ double NtcPierDrift(PIER_MODE mode, bool hollowBlocks, CCodeSheet& sheet);
 /// diagonal, and drifts are those of AnnexCDrifts.
 std::optional<T_PIER_STRENGTH> AnnexCPier(const T_PIER& pier, CCodeSheet& sheet);
 
-/// NTC 2018 7.8.2.2.4, 7.8.2.2.5: a spandrel between piers, tied by something that carries tension
-/// (tie beam, tie rod).
+/// NTC 2018 7.8.2.2.4, Circolare 2019 C8.7.1.3.1.1: a spandrel between piers, tied by something
+/// that carries tension (tie beam, tie rod).
 struct T_SPANDREL {
     double depth = 0.0, thickness = 0.0, length = 0.0; // m
     double tie = 0.0;                                  // strength of the tie, N
     double fm = 0.0;                                   // mean compressive strength, horizontal, Pa
-    double fv0 = 0.0;                                  // mean shear strength without compression
+    double tau0 = 0.0;                                 // mean shear strength
     double confidence = 1.0;
 };
 struct T_SPANDREL_STRENGTH {
-    double moment = 0.0, shear = 0.0; // Mu; Vt
-    double drift = 0.0;               // ultimate, of the chord
+    double moment = 0.0, shear = 0.0;            // Mu; Vt
+    double bendingDrift = 0.0, shearDrift = 0.0; // ultimate, of the chord
 };
 std::optional<T_SPANDREL_STRENGTH> NtcSpandrel(const T_SPANDREL& spandrel, CCodeSheet& sheet);
 

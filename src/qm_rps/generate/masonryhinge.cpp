@@ -63,12 +63,13 @@ std::optional<T_STRENGTHS> SpandrelOf(const T_MEMBER_END& end, const T_MASONRY& 
     s.length = end.clear;
     s.tie = end.tie;
     s.fm = m.fm;
-    s.fv0 = m.more.fv0 > 0.0 ? m.more.fv0 : m.more.tau0;
+    s.tau0 = m.more.tau0;
     s.confidence = m.confidence;
     const std::optional<T_SPANDREL_STRENGTH> found = NtcSpandrel(s, sheet);
     if (!found) return {};
     T_STRENGTHS out{found->moment, found->shear, {}, {}};
-    out.bending = out.sliding = NtcLimits(found->drift, sheet);
+    out.bending = NtcLimits(found->bendingDrift, sheet);
+    out.sliding = NtcLimits(found->shearDrift, sheet);
     return out;
 }
 
