@@ -42,19 +42,37 @@ T_VECTOR ReferenceOf(const T_ELEM_D& e, const T_VECTOR& x)
     return std::hypot(x[0], x[1]) < kVertical ? T_VECTOR{1.0, 0.0, 0.0} : T_VECTOR{0.0, 0.0, 1.0};
 }
 
-/// About which local axes the member bends.
+/// How far a direction normal to the axis x lies along another one: 0 across it, 1 along it.
+double Alignment(const T_VECTOR& direction, const T_VECTOR& with, const T_VECTOR& x)
+{
+    const auto across = [&](T_VECTOR v) {
+        const double along = Dot(v, x);
+        for (std::size_t i = 0; i < v.size(); ++i)
+            v[i] -= along * x[i];
+        return v;
+    };
+    const T_VECTOR a = across(direction), b = across(with);
+    return std::fabs(Dot(a, b)) / std::sqrt(Dot(a, a) * Dot(b, b));
+}
+
+/// About which local axes the member bends: that of a beam is the horizontal one, of which empty
+/// says that none is, within 10 degrees.
 std::vector<HINGE_COMPONENT> BendingOf(const T_MODEL& model, const T_ELEM_D& e, const T_VECTOR& x,
                                        bool column)
 {
-    if (!model.styp.plane)
-        return column ? std::vector<HINGE_COMPONENT>{kMy, kMz} : std::vector<HINGE_COMPONENT>{kMy};
+    if (!model.styp.plane && column) return {kMy, kMz};
     constexpr std::array<std::size_t, 3> kNormals{2, 1, 0}; // of XY, XZ, YZ
-    const std::size_t normal = kNormals[static_cast<std::size_t>(*model.styp.plane)];
-    const T_VECTOR z = ReferenceOf(e, x);
-    // Along the normal the part of z that is normal to x is that of z itself: x lies in the plane.
-    const double along = Dot(z, x);
-    const double size = std::sqrt(std::max(0.0, Dot(z, z) - along * along));
-    return {std::fabs(z[normal]) > 0.5 * size ? kMz : kMy};
+    T_VECTOR across{}; // the plane in which the member bends: its normal, or the vertical in it
+    if (model.styp.plane)
+        across[kNormals[static_cast<std::size_t>(*model.styp.plane)]] = 1.0;
+    else
+        across[VerticalAxis(model)] = 1.0;
+    const double aligned = Alignment(ReferenceOf(e, x), across, x);
+    if (model.styp.plane) return {aligned > 0.5 ? kMz : kMy};
+    constexpr double kNear = 0.98480775301; // cos 10 degrees
+    if (aligned > kNear) return {kMy};
+    if (aligned < std::sqrt(1.0 - kNear * kNear)) return {kMz};
+    return {};
 }
 
 int Refuse(std::string& reason, std::string words)
@@ -71,7 +89,7 @@ HINGE_COMPONENT StrongAxis(const T_SECT_D& section)
 
 bool TurnsFreely(const T_ELEM_D& e, const std::vector<HINGE_COMPONENT>& bending)
 {
-    return std::ranges::all_of(bending, [&](HINGE_COMPONENT c) {
+    return !bending.empty() && std::ranges::all_of(bending, [&](HINGE_COMPONENT c) {
         const auto at = static_cast<std::size_t>(c);
         return e.release.I[at] && e.release.J[at];
     });
@@ -212,6 +230,8 @@ int ReadMember(const T_MODEL& model, int element, const CInitialAxial& axial, T_
     m.section = e.section;
     m.material = e.material;
     SetKind(model, e, x, m);
+    if (m.bending.empty() && m.kind != MEMBER_KIND::Brace)
+        return Refuse(reason, Say("IDS_QM_GEN_SKEW"));
     m.axial = axial.Of(element);
     const double squash = SquashLoad(model.sections.at(e.section), model.materials.at(e.material));
     if (std::fabs(m.axial.I - m.axial.J) <= kSameAxial * squash) m.axial.J = m.axial.I;

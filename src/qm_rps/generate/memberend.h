@@ -24,10 +24,11 @@ struct T_HINGE_MEMBER {
 /// A truss, and a beam element of steel whose both ends turn freely, is a brace. Steeper than 45
 /// degrees a member is a column (masonry: pier), else a beam (spandrel); a column whose section is
 /// that of a wall and bends about its strong axis is a wall.
-/// Columns bend about y and z, beams about y, walls and piers about their strong axis; in a plane
-/// model each about the axis that is normal to the plane. 1 done; 0 with the reason: no such
-/// element, section or material missing, one of several elements of a member, nothing left between
-/// the offsets.
+/// Columns bend about y and z, beams about the axis that lies horizontal, walls and piers about
+/// their strong axis; in a plane model each about the axis that is normal to the plane. 1 done; 0
+/// with the reason: no such element, section or material missing, one of several elements of a
+/// member, nothing left between the offsets, a beam of which neither axis lies horizontal within 10
+/// degrees.
 [[nodiscard]] int ReadMember(const T_MODEL& model, int element, const CInitialAxial& axial,
                              T_HINGE_MEMBER& out, std::string& reason);
 
