@@ -50,6 +50,14 @@ T_CODE_POINT EndOf(const T_CODE_BACKBONE& bone, bool plateau, double end, CCodeS
     return {kEndOverUltimate * bone.D.deform, bone.D.strength};
 }
 
+/// FEMA 356 Table 6-8 prints IO above LS in a row of nonconforming columns: the smaller one counts.
+double RisingIo(const T_CODE_PLASTIC& p, CCodeSheet& sheet)
+{
+    if (p.IO <= p.LS) return p.IO;
+    sheet.Warn("IDS_QM_CODE_WARN_IO_ABOVE_LS", {CodeNumber(p.IO), CodeNumber(p.LS)});
+    return p.LS;
+}
+
 } // namespace
 
 std::optional<T_CODE_BACKBONE> BackboneOfPlastic(const T_CODE_PLASTIC& p, const T_BACKBONE_IN& in,
@@ -70,7 +78,7 @@ std::optional<T_CODE_BACKBONE> BackboneOfPlastic(const T_CODE_PLASTIC& p, const 
     bone.strengthLoss = p.c < bone.C.strength;
     bone.E = EndOf(bone, p.b > p.a, y + end, sheet);
     if (in.acceptance)
-        bone.acceptance = {{y + p.IO, y + p.LS, y + p.CP}};
+        bone.acceptance = {{y + RisingIo(p, sheet), y + p.LS, y + p.CP}};
     else
         sheet.Warn("IDS_QM_CODE_WARN_NO_ACCEPTANCE", {kCurve});
     bone.forceControlled = !(end > 0.0);
