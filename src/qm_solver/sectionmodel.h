@@ -74,7 +74,7 @@ struct T_SECTION_MODEL {
     std::vector<T_STRESS_LAW> laws;
     std::vector<T_SECTION_REGION> regions;
     std::vector<T_SECTION_BAR> bars;
-    bool lumped = false;                 // bars stand for groups, whose circles may overlap
+    bool lumped = false; // bars stand for groups: circles may overlap, but hold no other's centre
     double momentY = 0.0, momentZ = 0.0; // the point (y, z) that moments refer to
     PIVOT_RULE pivot = PIVOT_RULE::Eurocode;
     /// Full plasticity of steel without strains: the strength in compression on one side of a

@@ -53,11 +53,20 @@ bool Solve(const CSectionBending& bending, T_DIRECTION& out)
     return true;
 }
 
+/// The centre of one lies within the other: a bar was entered twice.
+bool StandsIn(const T_REBAR& a, const T_REBAR& b)
+{
+    const double radius = std::sqrt(std::max(a.area, b.area) / std::numbers::pi);
+    return std::hypot(a.y - b.y, a.z - b.z) < 0.999 * radius;
+}
+
 SECT_FAULT CheckBars(const T_SECT_D& s)
 {
     if (s.bars.empty()) return SECT_FAULT::NoBars;
     double steel = 0.0;
     for (const T_REBAR& b : s.bars) {
+        if (std::any_of(s.bars.data(), &b, [&](const T_REBAR& a) { return StandsIn(a, b); }))
+            return SECT_FAULT::Bars;
         const bool inside = s.shape == SECT_SHAPE::Circle ? std::hypot(b.y, b.z) < 0.5 * s.size[0]
                                                           : std::fabs(b.z) < 0.5 * s.size[0] &&
                                                                 std::fabs(b.y) < 0.5 * s.size[1];

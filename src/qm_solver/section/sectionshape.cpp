@@ -123,9 +123,11 @@ bool CheckBar(const T_SECTION_MODEL& m, std::size_t i, std::size_t& host, T_SECT
     });
     if (in == m.regions.end()) return Set(error, SECTION_FAULT::BarOutside);
     host = in->law;
-    for (std::size_t k = 0; k < i && !m.lumped; ++k) {
+    for (std::size_t k = 0; k < i; ++k) {
         const double apart = std::hypot(bar.y - m.bars[k].y, bar.z - m.bars[k].z);
-        if (apart >= 0.5 * (Diameter(bar) + Diameter(m.bars[k])) * (1.0 - kTouching)) continue;
+        const double own = Diameter(bar), other = Diameter(m.bars[k]);
+        const double least = 0.5 * (m.lumped ? std::max(own, other) : own + other);
+        if (apart >= least * (1.0 - kTouching)) continue;
         error.otherBar = static_cast<long>(k);
         return Set(error, SECTION_FAULT::BarsOverlap);
     }
