@@ -31,8 +31,11 @@ std::string ClauseOf(const std::vector<T_CODE_TRACE>& trace,
 /// Takes a sheet's lines behind those that stand, and its warnings.
 void Keep(const CCodeSheet& sheet, T_MODE_CHECK& check, T_END_CHECKS& out);
 
-/// The chord rotation of the state on the sheet; 0 at a free or pinned end, which turns without
-/// being bent.
+/// Of concrete and steel: the angle between the end and its chord to the end of the shear span, on
+/// the sheet. EN 1998-3 A.3.1.
+double SpanChordDemand(const T_CHECKING& c, const T_MEMBER_END& member, CCodeSheet& sheet);
+/// Of masonry: the rotation of the end less that of the chord of the member; 0 at a free or pinned
+/// end, which turns without being bent.
 double ChordDemand(const T_CHECKING& c, const T_MEMBER_END& member, CCodeSheet& sheet);
 /// |chord rotation| against DL, SD, NC of the hinge that the code gives.
 void GeneratedChord(const T_CHECKING& c);

@@ -44,7 +44,7 @@ void ChordRotations(const T_CHECKING& c)
         check.why = ReasonOf(sheet);
         return;
     }
-    const double theta = ChordDemand(c, member, sheet);
+    const double theta = SpanChordDemand(c, member, sheet);
     const T_CHORD_LIMITS& limits = found->limits;
     const std::array<double, kLevels> capacity{limits.DL, limits.SD, limits.NC};
     c.out.thetaY = found->thetaY;

@@ -84,8 +84,12 @@ T_MEMBER_END RotationEnd(const T_JUDGED_END& end, const T_END_STATE& s, CCodeShe
 {
     T_MEMBER_END member = end.member;
     member.axial = s.N;
-    member.shearSpan =
-        SpanOf(member, s, member.clear, "M/V beyond the clear length: clear length", sheet);
+    constexpr double kStoreys = 10.0; // that a wall may go on over, in clear lengths
+    const bool wall = member.kind == MEMBER_KIND::Wall;
+    member.shearSpan = SpanOf(member, s, wall ? kStoreys * member.clear : member.clear,
+                              wall ? "M/V beyond ten clear lengths: these"
+                                   : "M/V beyond the clear length: clear length",
+                              sheet);
     return member;
 }
 
@@ -151,6 +155,20 @@ double ChordDemand(const T_CHECKING& c, const T_MEMBER_END& member, CCodeSheet& 
                      K);
 }
 
+double SpanChordDemand(const T_CHECKING& c, const T_MEMBER_END& member, CCodeSheet& sheet)
+{
+    constexpr const char* kClause = "EN 1998-3 A.3.1";
+    const T_END_STATE& s = c.state;
+    const double moment = c.end.hinge >= 0 ? s.hingeMoment : s.M, span = member.ShearSpan();
+    const double bent = moment * span / (3.0 * member.EI);
+    const double sheared = member.GA > 0.0 ? moment / (span * member.GA) : 0.0;
+    const double elastic =
+        sheet.Put("theta_el", bent + sheared, kClause,
+                  "M LV/(3 EI) + M/(LV G Av), of the model: the end against its chord to LV", K);
+    const double turned = sheet.Put("theta_h", s.flowed, "", "rotation of the hinge", K);
+    return sheet.Put("theta", std::fabs(elastic + turned), kClause, "|theta_el + theta_h|", K);
+}
+
 void GeneratedChord(const T_CHECKING& c)
 {
     T_MODE_CHECK& check = c.Of(JUDGE_MODE::Rotation);
@@ -162,7 +180,7 @@ void GeneratedChord(const T_CHECKING& c)
     Keep(span, check, c.out);
     check.trace.insert(check.trace.end(), side->trace.begin(), side->trace.end());
     c.out.warnings.insert(c.out.warnings.end(), side->warnings.begin(), side->warnings.end());
-    const double theta = ChordDemand(c, member, sheet);
+    const double theta = SpanChordDemand(c, member, sheet);
     for (std::size_t i = 0; i < kLevels; ++i) {
         check.at[i] = T_CHECK{theta, (*side->bone.acceptance)[i]};
         check.clause[i] =

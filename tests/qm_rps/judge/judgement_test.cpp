@@ -92,7 +92,10 @@ TEST(Judgement, ChordRotationAndShearOfAColumnAsTheOracleHasThem)
     const double axial = 24.90940718540595 * kN, cyclic = 80.49401005269928 * kN;
     const T_JUDGED_END end = Column(HINGE_CODE::En1998);
     for (const double theta : {-0.008, 0.02, -0.09}) {
-        const T_END_CHECKS checks = Checked(end, State(theta, -60.0 * kN));
+        // The hinge turns beside the elastic M LV/(3 EI) = -180 kNm 3 m/(3 32 MNm2).
+        T_END_STATE s = State(theta, -60.0 * kN);
+        s.flowed = theta + 180e3 / 32e6;
+        const T_END_CHECKS checks = Checked(end, s);
         ASSERT_EQ("", WhyNot(checks));
         EXPECT_NEAR(3.0, checks.LV, 1e-12);
         EXPECT_NEAR(thetaY, checks.thetaY, 1e-9);
@@ -159,15 +162,22 @@ TEST(Judgement, ShearSpanStaysWithinTheMember)
     }
 }
 
-// The top of a cantilever turns without being bent; a hinge that has lost its moment was.
-TEST(Judgement, FreeEndHasNoRotationDemand)
+// The top of a cantilever is not bent; a hinge that has lost its moment has turned; the foot of a
+// wall has its point without moment beyond the storey: 90 kNm over 12 m of 32 MNm2.
+TEST(Judgement, EndTurnsAgainstItsChordToTheShearSpan)
 {
+    T_JUDGED_END end = Column(HINGE_CODE::En1998);
     T_END_STATE s = State(0.03, 60.0 * kN);
     s.M = 1e-9;
     s.flowed = 0.0;
-    EXPECT_EQ(0.0, Checked(Column(HINGE_CODE::En1998), s).At(kRotation, 2)->demand);
+    EXPECT_NEAR(0.0, Checked(end, s).At(kRotation, 2)->demand, 1e-15);
     s.flowed = 0.02;
-    EXPECT_EQ(0.03, Checked(Column(HINGE_CODE::En1998), s).At(kRotation, 2)->demand);
+    EXPECT_NEAR(0.02, Checked(end, s).At(kRotation, 2)->demand, 1e-15);
+    s.flowed = 0.0;
+    s.M = 90.0 * kN;
+    s.V = 7.5 * kN;
+    end.member.kind = MEMBER_KIND::Wall;
+    EXPECT_NEAR(90e3 * 12.0 / (3.0 * 32e6), Checked(end, s).At(kRotation, 2)->demand, 1e-12);
 }
 
 // The base reaction peaks in state 2 of 4. By the Circolare shear comes from there in state 3, by
