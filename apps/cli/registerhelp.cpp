@@ -127,6 +127,10 @@ std::string ParserWords(const std::string& what)
         const auto args = PlacesIn(MMSGFunction::GetValueOf("en", key), what);
         if (!args) continue;
         const std::vector<std::string_view> views(args->begin(), args->end());
+        // The upper end of positive numbers is the largest one, which the parser writes out.
+        constexpr std::size_t kLongest = 40;
+        if (args->back().size() > kLongest && args->size() == 4)
+            return Say("IDS_QM_CLI_ARG_ABOVE", (*args)[0], (*args)[1]);
         return zql::lib::FillPlaces(MMSGFunction::GetValue(key), views);
     }
     return what;

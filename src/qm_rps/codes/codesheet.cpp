@@ -13,13 +13,14 @@ struct T_REASON_TEXT {
     CODE_REASON reason;
     const char* key;
 };
-constexpr std::array<T_REASON_TEXT, 6> kReasonTexts{{
+constexpr std::array<T_REASON_TEXT, 7> kReasonTexts{{
     {CODE_REASON::NotFinite, "IDS_QM_CODE_FAULT_NOT_FINITE"},
     {CODE_REASON::NotPositive, "IDS_QM_CODE_FAULT_NOT_POSITIVE"},
     {CODE_REASON::Negative, "IDS_QM_CODE_FAULT_NEGATIVE"},
     {CODE_REASON::OutOfRange, "IDS_QM_CODE_FAULT_RANGE"},
     {CODE_REASON::Missing, "IDS_QM_CODE_FAULT_MISSING"},
     {CODE_REASON::NoRow, "IDS_QM_CODE_FAULT_NO_ROW"},
+    {CODE_REASON::Tension, "IDS_QM_CODE_FAULT_TENSION"},
 }};
 
 } // namespace

@@ -35,7 +35,7 @@ struct T_CODE_WARNING {
 };
 std::string WarningText(const T_CODE_WARNING& warning);
 
-enum class CODE_REASON { NotFinite, NotPositive, Negative, OutOfRange, Missing, NoRow };
+enum class CODE_REASON { NotFinite, NotPositive, Negative, OutOfRange, Missing, NoRow, Tension };
 
 /// Why there is no answer.
 struct T_CODE_FAULT {

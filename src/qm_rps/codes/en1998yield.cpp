@@ -49,7 +49,7 @@ std::optional<T_EN_YIELD> EnYield(const T_EN_MEMBER& m, CCodeSheet& sheet)
     const double concreteXi = NeutralAxis(alpha, r.Sum() - c / (1.8 * alpha), r.Moment());
     const double concrete = 1.8 * m.fc / (m.Ec * concreteXi * m.d);
     if (!(steelXi > 0.0) || !(concreteXi > 0.0)) { // the whole section is in tension
-        sheet.Refuse(CODE_REASON::OutOfRange, "axial", "xi_y > 0");
+        sheet.Refuse(CODE_REASON::Tension, "axial", "xi_y > 0");
         return {};
     }
     T_EN_YIELD y;
