@@ -21,7 +21,7 @@ bool Positive(double v)
 bool SoundSize(const T_SECT_D& s)
 {
     const auto& [a, b, c, d] = s.size;
-    if (!FilletFits(s)) return false;
+    if (!FilletFits(s) || !TaperFits(s)) return false;
     switch (s.shape) {
     case SECT_SHAPE::Value:
         return true;
@@ -36,6 +36,9 @@ bool SoundSize(const T_SECT_D& s)
                2.0 * d < a;
     case SECT_SHAPE::IShape:
         return Positive(a) && Positive(b) && Positive(c) && Positive(d) && c <= b && 2.0 * d < a;
+    case SECT_SHAPE::Channel:
+        return Positive(a) && Positive(b) && Positive(c) && Positive(d) && c < b &&
+               2.0 * FlangeEnds(s).first < a;
     }
     return false;
 }
@@ -114,7 +117,7 @@ double RectangleTorsion(double h, double w)
 }
 
 /// Torsion constant. Circle and pipe: polar second moment. Box: Bredt on the wall centre lines.
-/// I: sum of b t3 / 3 of the plates, web between the flanges.
+/// I, channel: sum of b t3 / 3 of the plates, web between the flanges.
 double Torsion(const T_SECT_D& s)
 {
     const auto& [a, b, c, d] = s.size;
@@ -130,6 +133,7 @@ double Torsion(const T_SECT_D& s)
         return 2.0 * h * h * w * w / (h / c + w / d);
     }
     case SECT_SHAPE::IShape:
+    case SECT_SHAPE::Channel:
         return (2.0 * b * std::pow(d, 3) + (a - 2.0 * d) * std::pow(c, 3)) / 3.0;
     case SECT_SHAPE::Value:
         break;
@@ -139,7 +143,7 @@ double Torsion(const T_SECT_D& s)
 
 /// Shear areas of stiffness. Rectangle 5/6 A and circle 9/10 A: energy of the parabolic shear
 /// stress (Timoshenko, Strength of Materials I). Pipe A/2: thin wall. Box: two webs or two flanges
-/// over the full outside. I: web over the full height; flanges as rectangles.
+/// over the full outside. I, channel: web over the full height; flanges as rectangles.
 void ShearAreas(T_SECT_D& s)
 {
     const auto& [a, b, c, d] = s.size;
@@ -158,12 +162,36 @@ void ShearAreas(T_SECT_D& s)
         s.Asy = 2.0 * b * d;
         break;
     case SECT_SHAPE::IShape:
+    case SECT_SHAPE::Channel:
         s.Asz = a * c;
         s.Asy = 5.0 / 6.0 * 2.0 * b * d;
         break;
     case SECT_SHAPE::Value:
         break;
     }
+}
+
+/// Of a shape that is symmetric about both axes.
+void TakeSymmetric(T_SECT_D& s)
+{
+    T_MOMENTS y = Sum(CSectionProperties::Pieces(s, true));
+    T_MOMENTS z = Sum(CSectionProperties::Pieces(s, false));
+    if (s.fillet > 0.0) AddFillets(s, y, z);
+    s.area = y.area;
+    s.Iyy = y.I;
+    s.Izz = z.I;
+    s.Zy = y.Z;
+    s.Zz = z.Z;
+}
+
+void TakeChannel(T_SECT_D& s)
+{
+    const T_CHANNEL c = ChannelProperties(s);
+    s.area = c.area;
+    s.Iyy = c.Iyy;
+    s.Izz = c.Izz;
+    s.Zy = c.Zy;
+    s.Zz = c.Zz;
 }
 
 } // namespace
@@ -205,13 +233,7 @@ int CSectionProperties::Calc(const T_SECT_D& in, T_SECT_D& out, SECT_FAULT& faul
     if (fault != SECT_FAULT::None) return 0;
     T_SECT_D s = in;
     if (s.shape != SECT_SHAPE::Value) {
-        T_MOMENTS y = Sum(Pieces(s, true)), z = Sum(Pieces(s, false));
-        if (s.fillet > 0.0) AddFillets(s, y, z);
-        s.area = y.area;
-        s.Iyy = y.I;
-        s.Izz = z.I;
-        s.Zy = y.Z;
-        s.Zz = z.Z;
+        s.shape == SECT_SHAPE::Channel ? TakeChannel(s) : TakeSymmetric(s);
         s.J = Torsion(s);
         ShearAreas(s);
     }
@@ -240,6 +262,11 @@ T_SHEAR_AREAS CSectionProperties::StrengthShearAreas(const T_SECT_D& section)
         const double rolled = section.area - 2.0 * b * d + (c + 2.0 * section.fillet) * d;
         return {section.area - web, std::max(rolled, web)};
     }
+    case SECT_SHAPE::Channel: {
+        const double web = (a - 2.0 * d) * c;
+        if (section.fillet == 0.0) return {section.area - web, web};
+        return {section.area - web, section.area - 2.0 * b * d + (c + section.fillet) * d};
+    }
     case SECT_SHAPE::Value:
         break;
     }
@@ -263,6 +290,7 @@ std::vector<T_SECT_PIECE> CSectionProperties::Pieces(const T_SECT_D& section, bo
     case SECT_SHAPE::IShape:
         if (aboutY) return {{1.0, false, b, a}, {-1.0, false, b - c, a - 2.0 * d}};
         return {{1.0, false, 2.0 * d, b}, {1.0, false, a - 2.0 * d, c}};
+    case SECT_SHAPE::Channel: // not symmetric
     case SECT_SHAPE::Value:
         break;
     }

@@ -1,8 +1,9 @@
-// Properties of rectangle, circle, pipe, box and I from their dimensions and fillets; torsion and
-// stiffness in shear as with sharp corners.
+// Properties of rectangle, circle, pipe, box, I and channel from their dimensions and fillets;
+// torsion and stiffness in shear as with sharp corners.
 #pragma once
 
 #include "qm_db/records/structrecords.h"
+#include "qm_db/shape/channelshape.h"
 
 #include <string>
 #include <vector>
@@ -46,13 +47,13 @@ public:
 
     /// Shear areas Av of steel for strength; those of stiffness are the section's Asy and Asz.
     /// EN 1993-1-1 6.2.6(3): I and box as welded (d, e; eta = 1) or, with a fillet, as
-    /// rolled (a, eta = 1; f), pipe (g). Solid
+    /// rolled (a, eta = 1; f), channel likewise (d, e; c), pipe (g). Solid
     /// sections have none there: first yield of 6.2.6(4), (5), 2/3 A of a rectangle and 3/4 A of a
     /// circle. A section given by values: as entered. `section` carries its properties.
     static T_SHEAR_AREAS StrengthShearAreas(const T_SECT_D& section);
 
     /// The section as a sum of pieces for bending about y (depth along z) or about z. Empty for a
-    /// section given by values, without fillets. The dimensions must be sound.
+    /// section given by values and of a channel, without fillets. The dimensions must be sound.
     static std::vector<T_SECT_PIECE> Pieces(const T_SECT_D& section, bool aboutY);
 };
 

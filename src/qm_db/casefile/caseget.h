@@ -183,6 +183,12 @@ public:
     {
         if (m_names) m_in.Check(key, ok, reason);
     }
+    /// Refuses a member in words of the message catalogue; `args` take their places.
+    template <class... ARGS>
+    void Refuse(const char* key, const char* reason, const ARGS&... args)
+    {
+        m_in.FailAt(key, reason, args...);
+    }
     template <class R, class F>
     void CheckEach(const char* key, const R& values, F ok, const char* reason)
     {

@@ -4,8 +4,8 @@
 #include <array>
 
 inline constexpr std::array<const char*, 4> kMatlNames{"concrete", "steel", "composite", "masonry"};
-inline constexpr std::array<const char*, 6> kShapeNames{"value", "rectangle", "circle",
-                                                        "pipe",  "box",       "I"};
+inline constexpr std::array<const char*, 7> kShapeNames{"value", "rectangle", "circle", "pipe",
+                                                        "box",   "I",         "channel"};
 inline constexpr std::array<const char*, 5> kHingeElementNames{"beam-column", "wall", "truss",
                                                                "general link", "point spring"};
 inline constexpr std::array<const char*, 3> kDefinitionNames{

@@ -7,16 +7,18 @@
 
 #include <sstream>
 
-/// Shape, sizes and fillet of a named steel shape; see FindShape.
+/// Shape, sizes, fillet and taper of a named steel shape; see FindShape.
 inline std::optional<T_SECT_D> NamedShape(const std::string& name)
 {
-    constexpr std::array kShapes{SECT_SHAPE::IShape, SECT_SHAPE::Box, SECT_SHAPE::Pipe};
+    constexpr std::array kShapes{SECT_SHAPE::IShape, SECT_SHAPE::Channel, SECT_SHAPE::Box,
+                                 SECT_SHAPE::Pipe};
     const std::optional<T_STOCK_SHAPE> found = FindShape(name);
     if (!found) return {};
     T_SECT_D s;
     s.shape = kShapes[static_cast<std::size_t>(found->kind)];
     s.size = found->size;
     s.fillet = found->fillet;
+    s.taper = found->taper;
     return s;
 }
 

@@ -207,22 +207,39 @@ void CaseFields(V& v, T_FIELD_REF<V, T_SECT_FACTORS> r)
     v.Opt("Izz", r.Izz, 1.0);
 }
 
+/// The steel shape that a case file names, if it does; a name that is near to one is refused.
+template <class V>
+std::optional<T_SECT_D> NamedShapeOf(V& v)
+{
+    if constexpr (requires { v.TextOf("shape"); }) {
+        if (!v.Has("shape")) return {};
+        const std::string name = v.TextOf("shape");
+        if (const std::optional<T_SECT_D> named = NamedShape(name)) return named;
+        const std::string near = NearestShape(name);
+        const bool word = std::ranges::find(kShapeNames, name) != kShapeNames.end();
+        if (!word && !near.empty()) v.Refuse("shape", "IDS_QM_SECC_NEAR_SHAPE", name, near);
+    }
+    return {};
+}
+
 template <class V>
 void CaseFields(V& v, T_FIELD_REF<V, T_SECT_D> r)
 {
-    // A case file may name a steel shape; what is written are its dimensions.
-    std::optional<T_SECT_D> named;
-    if constexpr (requires { v.TextOf("shape"); })
-        if (v.Has("shape")) named = NamedShape(v.TextOf("shape"));
+    // What is written are the dimensions.
+    const std::optional<T_SECT_D> named = NamedShapeOf(v);
     if (!named) v.EnumOpt("shape", r.shape, SECT_SHAPE::Value, kShapeNames, "IDS_QM_CHOICE_SHAPE");
     v.Padded("size", r.size, kDimLength);
     v.Opt("fillet", r.fillet, 0.0, kDimLength);
+    v.Opt("taper", r.taper, 0.0);
+    v.Check("taper", TaperFits(r), "IDS_QM_CASE_TAPER");
     v.Check("fillet", FilletFits(r), "IDS_QM_CASE_FILLET");
     if constexpr (V::kReads) {
         if (named) {
             v.Check("size", !v.Has("size"), "IDS_QM_CASE_SHAPE_SIZE");
             v.Check("fillet", !v.Has("fillet"), "IDS_QM_CASE_SHAPE_SIZE");
-            r.shape = named->shape, r.size = named->size, r.fillet = named->fillet;
+            v.Check("taper", !v.Has("taper"), "IDS_QM_CASE_SHAPE_SIZE");
+            r.shape = named->shape, r.size = named->size;
+            r.fillet = named->fillet, r.taper = named->taper;
         }
     }
     const auto property = [&](const char* key, const char* old, auto& value, T_DIM dim) {

@@ -5,8 +5,10 @@
 #include <algorithm>
 #include <array>
 #include <cmath>
+#include <numbers>
 #include <optional>
 #include <string>
+#include <utility>
 #include <vector>
 
 /// One value for either end of an element.
@@ -60,7 +62,7 @@ struct T_MATL_D {
     bool operator==(const T_MATL_D&) const = default;
 };
 
-enum class SECT_SHAPE { Value, Rectangle, Circle, Pipe, Box, IShape };
+enum class SECT_SHAPE { Value, Rectangle, Circle, Pipe, Box, IShape, Channel };
 
 /// A reinforcing bar in section coordinates, from the centroid.
 struct T_REBAR {
@@ -92,7 +94,9 @@ struct T_SECT_D {
     std::string name;
     SECT_SHAPE shape = SECT_SHAPE::Value;
     /// Rectangle: height, width. Circle: diameter. Pipe: diameter, wall. Box: height, width, web,
-    /// flange. I: height, flange width, web, flange. Height is along z, width along y.
+    /// flange. I: height, flange width, web, flange. Channel: the same, its web at -y; a tapered
+    /// flange by its thickness at the middle of what stands out from the web. Height is along z,
+    /// width along y.
     std::array<double, 4> size{};
     double area = 0.0, Asy = 0.0, Asz = 0.0; // area, shear areas
     double J = 0.0, Iyy = 0.0, Izz = 0.0;    // second moments
@@ -100,9 +104,11 @@ struct T_SECT_D {
     T_SECT_FACTORS factorsI, factorsJ;
     std::vector<T_REBAR> bars; // concrete
     std::optional<T_SECT_DETAIL> detailing{};
-    /// I: radius where flange and web meet. Box: outer radius of the corners; the inner one is less
-    /// by the wall, at least the wall. 0: sharp (welded).
+    /// I, channel: radius where flange and web meet. Box: outer radius of the corners; the inner
+    /// one is less by the wall, at least the wall. 0: sharp (welded).
     double fillet = 0.0;
+    /// Channel: slope of the inner faces of the flanges; 0: parallel ones.
+    double taper = 0.0;
     bool operator==(const T_SECT_D&) const = default;
 };
 
@@ -112,13 +118,45 @@ inline double InnerRadius(const T_SECT_D& box)
     const double wall = std::max(box.size[2], box.size[3]);
     return box.fillet > 0.0 ? std::max(box.fillet - wall, wall) : 0.0;
 }
-/// The fillet has room; only an I and a box have one.
+/// Thickness of the flanges of a channel at the web and at the tip.
+inline std::pair<double, double> FlangeEnds(const T_SECT_D& channel)
+{
+    const double change = 0.5 * channel.taper * (channel.size[1] - channel.size[2]);
+    return {channel.size[3] + change, channel.size[3] - change};
+}
+/// The tips of tapered flanges are rounded with half the fillet, as DIN 1026-1 has it.
+inline double ToeRadius(const T_SECT_D& channel)
+{
+    return channel.taper > 0.0 ? 0.5 * channel.fillet : 0.0;
+}
+/// A part of its side that an arc between a face of the flange and the web or the tip takes.
+inline double ArcTangent(const T_SECT_D& channel, double radius)
+{
+    return radius * std::tan(0.25 * std::numbers::pi - 0.5 * std::atan(channel.taper));
+}
+/// Only the flanges of a channel are tapered; something is left of their tips.
+inline bool TaperFits(const T_SECT_D& s)
+{
+    return s.taper == 0.0 ||
+           (s.taper > 0.0 && s.shape == SECT_SHAPE::Channel && FlangeEnds(s).second > 0.0);
+}
+/// Fillets and rounded tips have room on web, faces and tips.
+inline bool ArcsFit(const T_SECT_D& channel)
+{
+    const double root = ArcTangent(channel, channel.fillet);
+    const double toe = ArcTangent(channel, ToeRadius(channel));
+    const double face = std::hypot(1.0, channel.taper) * (channel.size[1] - channel.size[2]);
+    const auto [thick, thin] = FlangeEnds(channel);
+    return thick + root <= 0.5 * channel.size[0] && root + toe <= face && toe <= thin;
+}
+/// The fillet has room; only an I, a channel and a box have one.
 inline bool FilletFits(const T_SECT_D& s)
 {
     if (s.fillet == 0.0) return true;
     const auto& [a, b, c, d] = s.size;
     if (!(s.fillet > 0.0)) return false;
     if (s.shape == SECT_SHAPE::IShape) return s.fillet <= 0.5 * (b - c) && s.fillet <= 0.5 * a - d;
+    if (s.shape == SECT_SHAPE::Channel) return ArcsFit(s);
     if (s.shape != SECT_SHAPE::Box) return false;
     return 2.0 * s.fillet <= std::min(a, b) &&
            2.0 * InnerRadius(s) <= std::min(b - 2.0 * c, a - 2.0 * d);

@@ -1,8 +1,13 @@
 #include "qm_db/stock/steelshapes.h"
 
+#include "qm_base/nearname.h"
+#include "qm_base/say.h"
 #include "qm_base/textformat.h"
+#include "qm_db/stock/rolledtables.h"
 
+#include <algorithm>
 #include <cctype>
+#include <iterator>
 #include <vector>
 
 namespace {
@@ -97,7 +102,6 @@ constexpr T_ROW kRows[] = {
 };
 // clang-format on
 constexpr double kMm = 1e-3;
-constexpr std::size_t kCount = std::size(kRows);
 
 /// Capital letters and digits without blanks.
 std::string Plain(const std::string& name)
@@ -149,13 +153,23 @@ std::optional<T_STOCK_SHAPE> Hollow(const std::string& plain)
 
 } // namespace
 
+std::string T_ROLLED_SHAPE::Family() const
+{
+    const auto letter = [](char c) { return c >= 'A' && c <= 'Z'; };
+    return {name.begin(), std::ranges::find_if_not(name, letter)};
+}
+
 std::span<const T_ROLLED_SHAPE> SteelShapes()
 {
     static const std::vector<T_ROLLED_SHAPE> kShapes = [] {
         std::vector<T_ROLLED_SHAPE> out;
         for (const T_ROW& r : kRows)
-            out.push_back({r.name, r.height * kMm, r.width * kMm, r.web * kMm, r.flange * kMm,
-                           r.fillet * kMm});
+            out.push_back({r.name,
+                           {STOCK_SHAPE::I,
+                            {r.height * kMm, r.width * kMm, r.web * kMm, r.flange * kMm},
+                            r.fillet * kMm}});
+        for (const auto family : {EuropeanChannels, AiscWideFlanges, AiscChannels})
+            std::ranges::move(family(), std::back_inserter(out));
         return out;
     }();
     return kShapes;
@@ -165,7 +179,21 @@ std::optional<T_STOCK_SHAPE> FindShape(const std::string& name)
 {
     const std::string plain = Plain(name);
     for (const T_ROLLED_SHAPE& s : SteelShapes())
-        if (Plain(s.name) == plain)
-            return T_STOCK_SHAPE{STOCK_SHAPE::I, {s.height, s.width, s.web, s.flange}, s.fillet};
+        if (Plain(s.name) == plain) return s.shape;
     return Hollow(plain);
+}
+
+std::string NearestShape(const std::string& name)
+{
+    std::vector<std::string_view> names;
+    for (const T_ROLLED_SHAPE& s : SteelShapes())
+        names.push_back(s.name);
+    return NearestName(name, names);
+}
+
+std::string NoShapeText(const std::string& name)
+{
+    const std::string near = NearestShape(name);
+    return near.empty() ? Say("IDS_QM_SECC_NO_SHAPE", name)
+                        : Say("IDS_QM_SECC_NEAR_SHAPE", name, near);
 }

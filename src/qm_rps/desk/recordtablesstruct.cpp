@@ -69,7 +69,8 @@ T_RECORD_COLUMNS<T_SECT_D> SectionColumns()
         IndexColumn<R>(
             "IDS_QM_UI_HEAD_SHAPE", [](R& r) -> SECT_SHAPE& { return r.shape; },
             {"IDS_QM_UI_SHAPE_VALUE", "IDS_QM_UI_SHAPE_RECTANGLE", "IDS_QM_UI_SHAPE_CIRCLE",
-             "IDS_QM_UI_SHAPE_PIPE", "IDS_QM_UI_SHAPE_BOX", "IDS_QM_UI_SHAPE_I"},
+             "IDS_QM_UI_SHAPE_PIPE", "IDS_QM_UI_SHAPE_BOX", "IDS_QM_UI_SHAPE_I",
+             "IDS_QM_UI_SHAPE_CHANNEL"},
             TextOf)};
     constexpr std::array<const char*, 4> sizes{"D1", "D2", "D3", "D4"};
     for (std::size_t d = 0; d < 4; ++d)
@@ -88,6 +89,7 @@ T_RECORD_COLUMNS<T_SECT_D> SectionColumns()
     add("Zy", kModulus, &R::Zy);
     add("Zz", kModulus, &R::Zz);
     add("r", kDimLength, &R::fillet);
+    add("IDS_QM_UI_SECT_TAPER", kDimNone, &R::taper);
     return c;
 }
 

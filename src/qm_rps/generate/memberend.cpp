@@ -158,6 +158,7 @@ void AppendSection(const T_SECT_D& s, std::vector<double>& to)
     Append(to, {f.area, f.Asy, f.Asz, f.J, f.Iyy, f.Izz});
     if (s.shape != SECT_SHAPE::Rectangle)
         Append(to, {1.0 * static_cast<int>(s.shape), s.size[2], s.size[3], s.fillet});
+    if (s.taper > 0.0) Append(to, {s.taper});
     for (const T_REBAR& bar : s.bars)
         Append(to, {bar.y, bar.z, bar.area});
 }

@@ -1,5 +1,7 @@
 #include "qm_rps/outline/sectionoutline.h"
 
+#include "qm_db/sectionproperties.h"
+
 #include <algorithm>
 #include <cmath>
 #include <limits>
@@ -49,6 +51,27 @@ T_RING IShape(double a, double b, double c, double d, double r)
             {y, z},   {-y, z}, {-y, f}, {-w, f}, {-w, -f}, {-y, -f}};
 }
 
+/// About the centroid.
+T_RING Channel(const T_SECT_D& section)
+{
+    const double back = -ChannelProperties(section).centroid, tip = back + section.size[1];
+    const double top = 0.5 * section.size[0];
+    const auto face = ChannelFace(section);
+    T_RING ring{{back, -top}, {tip, -top}};
+    // The lower face from its tip; the bulge of a way stands at its first corner.
+    for (std::size_t i = face.size(); i-- > 0;)
+        ring.push_back({back + face[i].y, -face[i].z, i > 0 ? face[i - 1].bulge : 0.0});
+    for (const T_FACE_CORNER& c : face)
+        ring.push_back({back + c.y, c.z, c.bulge});
+    ring.push_back({tip, top});
+    ring.push_back({back, top});
+    // Sharp corners stand there twice.
+    const auto same = [](const T_CORNER& a, const T_CORNER& b) { return a.y == b.y && a.z == b.z; };
+    const auto rest = std::ranges::unique(ring, same);
+    ring.erase(rest.begin(), rest.end());
+    return ring;
+}
+
 } // namespace
 
 std::vector<T_RING> SectionRings(const T_SECT_D& section)
@@ -66,6 +89,8 @@ std::vector<T_RING> SectionRings(const T_SECT_D& section)
                 Rounded(b - 2.0 * c, a - 2.0 * d, InnerRadius(section))};
     case SECT_SHAPE::IShape:
         return {IShape(a, b, c, d, section.fillet)};
+    case SECT_SHAPE::Channel:
+        return {Channel(section)};
     case SECT_SHAPE::Value:
         break;
     }

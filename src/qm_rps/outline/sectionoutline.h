@@ -4,7 +4,8 @@
 #include "qm_db/records.h"
 #include "qm_solver/sectionmodel.h"
 
-/// Outline and hollow; none of a section given by values. The dimensions must be sound.
+/// Outline and hollow about the centroid; none of a section given by values. The dimensions must be
+/// sound.
 std::vector<solver::T_RING> SectionRings(const T_SECT_D& section);
 
 /// Between the centre lines of the stirrups, of a rectangle or a circle with detailing; none of

@@ -2,9 +2,12 @@
 
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
+#include "qm_db/sectionproperties.h"
 #include "qm_rps/dialog/unithead.h"
+#include "qm_rps/outline/sectionoutline.h"
 #include "qm_rps/section/barlayout.h"
 
+#include <cmath>
 #include <limits>
 #include <numbers>
 
@@ -37,50 +40,37 @@ void AddRectangle(T_PLOT_SERIES& s, double height, double width)
     AddPoint(s, kGap, kGap);
 }
 
-/// Upper half from the right to the left, then the lower one back.
-void AddIShape(T_PLOT_SERIES& s, double height, double width, double web, double flange)
+/// A side of a ring; its arc in parts.
+void AddSide(T_PLOT_SERIES& s, const solver::T_CORNER& from, const solver::T_CORNER& to)
 {
-    const double top = 0.5 * height, inside = top - flange;
-    const std::array<std::array<double, 2>, 6> half{{{0.5 * web, 0.0},
-                                                     {0.5 * web, inside},
-                                                     {0.5 * width, inside},
-                                                     {0.5 * width, top},
-                                                     {-0.5 * width, top},
-                                                     {-0.5 * width, inside}}};
-    for (const auto& [y, z] : half)
-        AddPoint(s, y, z);
-    AddPoint(s, -0.5 * web, inside);
-    for (const auto& [y, z] : half)
-        AddPoint(s, -y, -z);
-    AddPoint(s, 0.5 * web, -inside);
-    AddPoint(s, 0.5 * web, 0.0);
+    AddPoint(s, from.y, from.z);
+    if (from.bulge == 0.0) return;
+    // The centre lies beside the middle of the chord.
+    constexpr int kParts = 24;
+    const double y = to.y - from.y, z = to.z - from.z;
+    const double beside = (1.0 - from.bulge * from.bulge) / (4.0 * from.bulge);
+    const double cy = 0.5 * (from.y + to.y) - beside * z, cz = 0.5 * (from.z + to.z) + beside * y;
+    const double angle = 4.0 * std::atan(from.bulge);
+    for (int i = 1; i < kParts; ++i) {
+        const double c = std::cos(angle * i / kParts), t = std::sin(angle * i / kParts);
+        AddPoint(s, cy + c * (from.y - cy) - t * (from.z - cz),
+                 cz + t * (from.y - cy) + c * (from.z - cz));
+    }
 }
 
+/// Empty of a section without a shape, or whose dimensions are not sound.
 T_PLOT_SERIES Outline(const T_SECT_D& section)
 {
-    const auto [a, b, c, d] = section.size;
     T_PLOT_SERIES s;
-    switch (section.shape) {
-    case SECT_SHAPE::Rectangle:
-        AddRectangle(s, a, b);
-        break;
-    case SECT_SHAPE::Circle:
-        AddCircle(s, 0.0, 0.0, a);
-        break;
-    case SECT_SHAPE::Pipe:
-        AddCircle(s, 0.0, 0.0, a);
-        AddCircle(s, 0.0, 0.0, a - 2.0 * b);
-        break;
-    case SECT_SHAPE::Box:
-        AddRectangle(s, a, b);
-        AddRectangle(s, a - 2.0 * d, b - 2.0 * c);
-        break;
-    case SECT_SHAPE::IShape:
-        AddIShape(s, a, b, c, d);
-        break;
-    case SECT_SHAPE::Value:
-        break;
-    }
+    T_SECT_D sound;
+    SECT_FAULT fault = SECT_FAULT::None;
+    if (CSectionProperties::Calc(section, sound, fault))
+        for (const solver::T_RING& ring : SectionRings(sound)) {
+            for (std::size_t i = 0; i < ring.size(); ++i)
+                AddSide(s, ring[i], ring[(i + 1) % ring.size()]);
+            AddPoint(s, ring.front().y, ring.front().z);
+            AddPoint(s, kGap, kGap);
+        }
     s.width = 2.4;
     s.color = T_PLOT_COLOR{60, 60, 60};
     return s;
