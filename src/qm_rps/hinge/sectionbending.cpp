@@ -44,6 +44,7 @@ CSectionBending::Of(const T_SECT_D& section, const T_MATL_D& material, const T_C
     CSectionBending out;
     out.m_plastic = material.type == MATL_CLASS::Steel;
     out.m_straight = section.shape == SECT_SHAPE::Value;
+    out.m_leans = out.m_plastic && section.shape == SECT_SHAPE::Channel;
     out.m_axial = section.area * material.Fy;
     out.m_moments = {section.Zy * material.Fy, section.Zz * material.Fy};
     out.Turn(true, true);
@@ -58,6 +59,7 @@ CSectionBending::Of(const T_SECT_D& section, const T_MATL_D& material, const T_C
 
 void CSectionBending::Turn(bool aboutY, bool positive)
 {
+    m_aboutY = aboutY;
     m_direction = (aboutY ? 0.0 : 0.5 * std::numbers::pi) + (positive ? 0.0 : std::numbers::pi);
     m_moment = m_moments[aboutY ? 0 : 1];
 }
@@ -67,8 +69,19 @@ T_AXIAL_MOMENT CSectionBending::Along(const T_CAPACITY& c) const
     return {c.axial, c.My * std::cos(m_direction) + c.Mz * std::sin(m_direction)};
 }
 
+int CSectionBending::Leaning(double axial, T_AXIAL_MOMENT& out) const
+{
+    constexpr double kTip = 1.0 - 1e-9; // nothing is left for moments
+    double moment = 0.0;
+    const double share = std::fabs(axial) / m_axial;
+    if (share < kTip && !Towards(m_direction, axial, moment)) return 0;
+    out = {axial, moment};
+    return 1;
+}
+
 int CSectionBending::At(double u, T_AXIAL_MOMENT& out) const
 {
+    if (m_leans && m_aboutY) return Leaning((u - 1.0) * m_axial, out);
     if (m_straight) {
         out = {(u - 1.0) * m_axial, (1.0 - std::fabs(u - 1.0)) * m_moment};
         return 1;
@@ -84,6 +97,7 @@ int CSectionBending::At(double u, T_AXIAL_MOMENT& out) const
 int CSectionBending::AtAxial(double axial, T_AXIAL_MOMENT& out) const
 {
     if (m_straight) return At(1.0 + axial / m_axial, out);
+    if (m_leans && m_aboutY) return Leaning(axial, out);
     T_CAPACITY found;
     T_SECTION_ERROR error;
     if (!m_solver.AtAxial(m_direction, axial, found, error)) return 0;
@@ -93,7 +107,7 @@ int CSectionBending::AtAxial(double axial, T_AXIAL_MOMENT& out) const
 
 int CSectionBending::Largest(T_AXIAL_MOMENT& out, double& u) const
 {
-    if (m_straight) {
+    if (m_straight || (m_leans && m_aboutY)) {
         u = 1.0;
         return At(u, out);
     }

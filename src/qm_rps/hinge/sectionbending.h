@@ -35,9 +35,13 @@ public:
 
 private:
     T_AXIAL_MOMENT Along(const solver::T_CAPACITY& capacity) const;
+    /// At an axial force with Mz = 0.
+    [[nodiscard]] int Leaning(double axial, T_AXIAL_MOMENT& out) const;
 
     solver::CSectionSolver m_solver;
-    bool m_plastic = false;
+    bool m_plastic = false, m_aboutY = true;
+    /// Of a channel: with an axial force, a neutral axis along y would leave a moment Mz.
+    bool m_leans = false;
     double m_direction = 0.0;
     /// Straight interaction of a section without a shape: axial strength, moments about y and z.
     bool m_straight = false;

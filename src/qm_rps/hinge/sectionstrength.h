@@ -31,8 +31,10 @@ struct T_SURFACE_ROW {
 /// Steel (any shape): full plasticity with fy in tension and compression, Fx = A fy, shear
 /// Av fy / sqrt(3) (CSectionProperties::StrengthShearAreas), moments Z fy. The interaction is exact
 /// for the shape: the plastic neutral axis at +-a gives P = fy (area within a) and M = fy (first
-/// moment beyond a). A section given by values has no shape; its interaction is the straight line M
-/// = Z fy (1 - P / A fy), a lower bound for every section that is symmetric about both axes.
+/// moment beyond a). A channel under an axial force carries My with Mz = 0: its neutral axis leans,
+/// an axis along y would leave a moment Mz and give too much. A section given by values has no
+/// shape; its interaction is the straight line M = Z fy (1 - P / A fy), a lower bound for every
+/// section that is symmetric about both axes.
 ///
 /// Concrete (rectangle, circle, with bars): plane sections; parabola-rectangle of EN 1992-1-1
 /// 3.1.7 (ConcreteLaw, up to C90; alpha_cc = 1); bars elastic-perfectly plastic without a strain

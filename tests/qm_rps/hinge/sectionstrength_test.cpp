@@ -110,6 +110,34 @@ TEST(SectionStrength, SteelGivesEveryStrengthAndTheTenPoints)
     }
 }
 
+// Sharp channel 200 x 80, web 10, flanges 20 mm, fy = 1: A 4800, centroid 28.333 from the back.
+// About z by hand: the neutral axis 30 from the back leaves 2000 at 55 on the right, the one at its
+// inner face 2800 at 45. My with Mz = 0 from an independent integration whose axis turns
+// (38.05, 19.90 and 9.32 degrees); an axis along y would give 316000, 222000 and 115500.
+TEST(SectionStrength, AChannelBendsAboutTheAxisThatLeavesNoOtherMoment)
+{
+    const T_SECT_D channel = Shape(SECT_SHAPE::Channel, {200, 80, 10, 20});
+    const T_MATL_D steel = Steel(1);
+    const auto moment = [&](bool aboutY, bool positive, double axial) {
+        double m = 0.0;
+        SECT_FAULT fault{};
+        EXPECT_EQ(1, CSectionStrength::CalcMoment(channel, steel, kUnits, aboutY, positive, axial,
+                                                  m, fault));
+        return m;
+    };
+    EXPECT_NEAR(2 * 2000 * (55 - 28.0 - 1.0 / 3.0), moment(false, true, -800), 0.1);
+    EXPECT_NEAR(2 * 2000 * (55 - 28.0 - 1.0 / 3.0), moment(false, false, 800), 0.1);
+    EXPECT_NEAR(2 * 2800 * (45 - 28.0 - 1.0 / 3.0), moment(false, true, 800), 0.1);
+    const double n[] = {0.0, 1200.0, 2400.0, 3600.0};
+    const double byHand[] = {352000.0, 300905.096, 217234.274, 114351.562};
+    for (std::size_t i = 0; i < 4; ++i)
+        for (const double sign : {-1.0, 1.0})
+            EXPECT_NEAR(byHand[i], moment(true, sign > 0, sign * n[i]), 1e-5 * byHand[i]) << i;
+    const T_SECTION_STRENGTH r = Strength(channel, steel);
+    EXPECT_NEAR(4800.0, r.level.compression, 1e-6);
+    EXPECT_NEAR(114351.562 / 352000.0, r.level.y.curves.pos[1].m, 1e-5); // 3600
+}
+
 // Parabola-rectangle block with the neutral axis at x inside the section: force 17/21 fck b x at
 // 99/238 x under the edge (0.8095 and 0.4160); bars less the concrete that they displace.
 TEST(SectionStrength, ConcreteColumnsFollowTheClosedFormDiagram)
