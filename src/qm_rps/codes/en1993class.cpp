@@ -47,8 +47,10 @@ int OfPlates(const T_STEEL_SHAPE& s, double eps, const T_LIMITS& web, CCodeSheet
 {
     const bool box = s.shape == STEEL_SHAPE::RectangularTube;
     const double depth = s.h - 2.0 * s.tf - 2.0 * s.r;
-    const double flange =
-        box ? (s.b - 2.0 * s.tw - 2.0 * s.r) / s.tf : (s.b - s.tw - 2.0 * s.r) / (2.0 * s.tf);
+    const double flange = box ? (s.b - 2.0 * s.tw - 2.0 * s.r) / s.tf
+                          : s.shape == STEEL_SHAPE::Channel
+                              ? (s.b - s.tw - s.r) / s.tf
+                              : (s.b - s.tw - 2.0 * s.r) / (2.0 * s.tf);
     const int first = ClassOf("c/t (flange)", flange, eps, box ? kCompressed : kOutstand,
                               box ? "33, 38, 42 eps" : "9, 10, 14 eps", sheet);
     const int second = ClassOf("c/t (web)", depth / s.tw, eps, web,
@@ -106,8 +108,11 @@ std::optional<int> En1993Class(const T_STEEL_SHAPE& s, bool aboutY, double axial
         std::swap(turned.tf, turned.tw);
     }
     const double clear = turned.h - 2.0 * turned.tf - 2.0 * turned.r;
-    // Across the minor axis the web of an I lies in the middle: it is compressed by N alone.
-    const T_LIMITS web = WebLimits(turned, clear, !box && !aboutY, axial, fy, sheet);
+    // Across the minor axis the web of an I lies in the middle: it is compressed by N alone. That
+    // of a channel lies at the edge, where either sign of the moment may compress it.
+    const T_LIMITS web = s.shape == STEEL_SHAPE::Channel && !aboutY
+                             ? kCompressed
+                             : WebLimits(turned, clear, !box && !aboutY, axial, fy, sheet);
     return PutClass(OfPlates(turned, eps, web, sheet), sheet);
 }
 

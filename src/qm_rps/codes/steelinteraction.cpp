@@ -21,11 +21,13 @@ struct T_SLENDER_ROW {
     double slenderFlange, slenderWeb; // uniform compression
     double compactFlange, compactWeb; // bending
 };
-constexpr std::array<T_SLENDER_ROW, 4> kSlender{{
+// Of a channel b is the whole flange, B4.1.
+constexpr std::array<T_SLENDER_ROW, 5> kSlender{{
     {STEEL_SHAPE::RolledI, 0.56, 1.49, 0.38, 3.76},
     {STEEL_SHAPE::WeldedI, 0.378, 1.49, 0.38, 3.76},
     {STEEL_SHAPE::RectangularTube, 1.40, 1.40, 1.12, 1.12},
     {STEEL_SHAPE::CircularTube, 0.11, 0.11, 0.07, 0.07},
+    {STEEL_SHAPE::Channel, 0.56, 1.49, 0.38, 3.76},
 }};
 
 bool IsI(STEEL_SHAPE shape)
@@ -83,6 +85,18 @@ T_EN_INTERACTION Reduced(const T_STEEL_SHAPE& s, const T_STEEL_PLASTIC_STRENGTH&
     return e;
 }
 
+/// EN 1993-1-1 (6.2).
+T_EN_INTERACTION Summed(const T_STEEL_PLASTIC_STRENGTH& r, const T_STEEL_FORCES& f, double n,
+                        CCodeSheet& sheet)
+{
+    T_EN_INTERACTION e;
+    e.MNy = (1.0 - n) * r.Mply;
+    e.MNz = (1.0 - n) * r.Mplz;
+    e.ratio = sheet.Put("ratio", n + std::fabs(f.My) / r.Mply + std::fabs(f.Mz) / r.Mplz,
+                        "EN 1993-1-1 6.2.1(7)", "N/Npl + My/Mpl,y + Mz/Mpl,z, (6.2)", R);
+    return e;
+}
+
 bool SoundForces(const T_STEEL_PLASTIC_STRENGTH& r, const T_STEEL_FORCES& f, CCodeSheet& sheet)
 {
     sheet.Positive({{"Npl", r.Npl}, {"Mply", r.Mply}, {"Mplz", r.Mplz}});
@@ -106,6 +120,9 @@ std::optional<double> EnShearArea(const T_STEEL_SHAPE& s, bool alongDepth, CCode
     } else if (!alongDepth) {
         area = s.A - web;
         text = "A - hw tw";
+    } else if (s.shape == STEEL_SHAPE::Channel && s.r > 0.0) {
+        area = s.A - 2.0 * s.b * s.tf + (s.tw + s.r) * s.tf;
+        text = "A - 2 b tf + (tw + r) tf";
     } else if (s.shape == STEEL_SHAPE::RolledI) {
         area = std::max(web, s.A - 2.0 * s.b * s.tf + (s.tw + 2.0 * s.r) * s.tf);
         text = "A - 2 b tf + (tw + 2r) tf >= hw tw";
@@ -140,6 +157,10 @@ std::optional<T_EN_INTERACTION> EnAxialBending(const T_STEEL_SHAPE& s,
     if (!Sound(s, sheet) || !SoundForces(r, f, sheet)) return {};
     const double n = sheet.Put("n", std::fabs(f.N) / r.Npl, kCombined, "N/Npl", S2);
     if (!sheet.Within("N", n, 0.0, 1.0 - 1e-9)) return {};
+    if (s.shape == STEEL_SHAPE::Channel) {
+        const T_EN_INTERACTION sum = Summed(r, f, n, sheet);
+        return sheet.Sound() ? std::optional(sum) : std::nullopt;
+    }
     T_EN_INTERACTION e = Reduced(s, r, n, sheet);
     sheet.Put("alpha", e.alpha, kCombined, "I: 2; CHS: 2; RHS: 1.66/(1 - 1.13 n^2) <= 6", S2);
     sheet.Put("beta", e.beta, kCombined, "I: 5 n >= 1; CHS: 2; RHS: alpha", S2);
@@ -181,8 +202,8 @@ std::optional<double> AiscShapeShear(const T_STEEL_SHAPE& s, bool alongDepth, do
                                      CCodeSheet& sheet)
 {
     if (!Sound(s, sheet)) return {};
-    if (!IsI(s.shape)) {
-        sheet.Refuse(CODE_REASON::NoRow, "shape", "AISC 360 G2.1 (I)");
+    if (!IsI(s.shape) && s.shape != STEEL_SHAPE::Channel) {
+        sheet.Refuse(CODE_REASON::NoRow, "shape", "AISC 360 G2.1 (I, channel)");
         return {};
     }
     if (alongDepth) return AiscShear(s.h, s.h - 2.0 * (s.tf + s.r), s.tw, Fy, E, sheet);
@@ -207,7 +228,8 @@ bool AiscPlastic(const T_STEEL_SHAPE& s, double Fy, double E, bool compressed, b
     };
     if (tube) return judge("D/t", s.h / s.tw, row->slenderFlange, row->compactFlange);
     const bool box = s.shape == STEEL_SHAPE::RectangularTube;
-    const double flange = box ? (s.b - 2.0 * (s.tw + s.r)) / s.tf : s.b / (2.0 * s.tf);
+    const double half = s.shape == STEEL_SHAPE::Channel ? s.b : 0.5 * s.b;
+    const double flange = box ? (s.b - 2.0 * (s.tw + s.r)) / s.tf : half / s.tf;
     const double web = (s.h - 2.0 * (s.tf + s.r)) / s.tw;
     return judge("b/t (flange)", flange, row->slenderFlange, row->compactFlange) &&
            judge("h/t (web)", web, row->slenderWeb, row->compactWeb);

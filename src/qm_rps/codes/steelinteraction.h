@@ -3,13 +3,13 @@
 
 #include "qm_rps/codes/codesheet.h"
 
-enum class STEEL_SHAPE { RolledI, WeldedI, RectangularTube, CircularTube };
+enum class STEEL_SHAPE { RolledI, WeldedI, RectangularTube, CircularTube, Channel };
 struct T_STEEL_SHAPE {
     STEEL_SHAPE shape = STEEL_SHAPE::RolledI;
     double A = 0.0;            // m2
     double h = 0.0, b = 0.0;   // depth along the force that bends about y, width; m
     double tf = 0.0, tw = 0.0; // I-shapes; the wall of a tube in both
-    double r = 0.0;            // fillet of a rolled shape, m
+    double r = 0.0;            // fillet of a rolled shape, m; 0 of a channel: welded
 };
 
 /// EN 1993-1-1 6.2.6(3): shear area for a force along the depth (of an I: parallel to the web), or
@@ -32,7 +32,8 @@ struct T_EN_INTERACTION {
     double alpha = 1.0, beta = 1.0;
     double ratio = 0.0; // M/MN about one axis; (My/MNy)^alpha + (Mz/MNz)^beta about both
 };
-/// EN 1993-1-1 6.2.9.1, sections of class 1 and 2.
+/// EN 1993-1-1 6.2.9.1, sections of class 1 and 2. A channel, of which it says nothing: (6.2), the
+/// sum of the ratios, which the convex surface of full plasticity contains.
 std::optional<T_EN_INTERACTION> EnAxialBending(const T_STEEL_SHAPE& s,
                                                const T_STEEL_PLASTIC_STRENGTH& r,
                                                const T_STEEL_FORCES& f, CCodeSheet& sheet);
@@ -41,11 +42,12 @@ std::optional<T_EN_INTERACTION> EnAxialBending(const T_STEEL_SHAPE& s,
 std::optional<double> AiscInteraction(const T_STEEL_PLASTIC_STRENGTH& available,
                                       const T_STEEL_FORCES& f, CCodeSheet& sheet);
 
-/// AISC 360 G2.1, webs of I-shapes without stiffeners: Vn = 0.6 Fy Aw Cv1. d: whole depth, h: clear
-/// web depth.
+/// AISC 360 G2.1, webs of I-shapes and channels without stiffeners: Vn = 0.6 Fy Aw Cv1. d: whole
+/// depth, h: clear web depth.
 std::optional<double> AiscShear(double d, double h, double tw, double Fy, double E,
                                 CCodeSheet& sheet);
-/// Of an I along its web (G2.1), or of its flanges across it (G6). Refuses other shapes.
+/// Of an I or a channel along its web (G2.1), or of its flanges across it (G6). Refuses other
+/// shapes.
 std::optional<double> AiscShapeShear(const T_STEEL_SHAPE& s, bool alongDepth, double Fy, double E,
                                      CCodeSheet& sheet);
 

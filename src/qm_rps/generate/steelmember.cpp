@@ -51,8 +51,10 @@ std::optional<T_STEEL_SHAPE> SteelShapeOf(const T_SECT_D& s, CCodeSheet& sheet)
         return T_STEEL_SHAPE{STEEL_SHAPE::RectangularTube, s.area, a, b, d, c, InnerRadius(s)};
     case SECT_SHAPE::Pipe:
         return T_STEEL_SHAPE{STEEL_SHAPE::CircularTube, s.area, a, a, b, b, 0.0};
+    case SECT_SHAPE::Channel:
+        return T_STEEL_SHAPE{STEEL_SHAPE::Channel, s.area, a, b, d, c, r};
     default:
-        sheet.Refuse(CODE_REASON::Missing, "shape: I, box, pipe", s.name);
+        sheet.Refuse(CODE_REASON::Missing, "shape: I, box, pipe, channel", s.name);
         return {};
     }
 }
@@ -79,6 +81,11 @@ std::optional<T_STEEL_BASIS> SteelBasis(const T_MEMBER_END& end, CCodeSheet& she
 {
     double lower = 0.0;
     const std::optional<double> fy = Yield(end, lower, sheet);
+    // Their tables have no such row, and such members twist when they buckle.
+    if (end.section.shape == SECT_SHAPE::Channel) {
+        sheet.Refuse(CODE_REASON::NoRow, "shape: channel", "ASCE 41, AISC 342, EN 1998-3");
+        return {};
+    }
     const auto shape = fy ? SteelShapeOf(end.section, sheet) : std::nullopt;
     const T_SECT_D& s = end.section;
     if (!shape || !sheet.Positive({{"E", end.material.E}, {"clear length", end.clear}})) return {};

@@ -21,12 +21,12 @@ struct T_STEEL_BASIS {
     T_STEEL_MEMBER Member() const;
 };
 
-/// I, box or pipe with its fillet: an I without one is welded; other shapes are refused.
+/// I, box, pipe or channel with its fillet: an I without one is welded; other shapes are refused.
 std::optional<T_STEEL_SHAPE> SteelShapeOf(const T_SECT_D& section, CCodeSheet& sheet);
 
 /// ASCE 41: the material's mean, else Fy times the
 /// factor of Table 9-3. EN 1998-3, Circolare: the mean, else Fy with a warning, over the confidence
-/// factor. Refuses other shapes and materials.
+/// factor. Refuses channels, other shapes and materials.
 std::optional<T_STEEL_BASIS> SteelBasis(const T_MEMBER_END& end, CCodeSheet& sheet);
 
 /// The edition of ASCE 41 whose rules hold; AISC 342 takes the strengths of 41-17.

@@ -1,5 +1,6 @@
 #include "qm_rps/section/sectionmodelof.h"
 
+#include "qm_db/sectionproperties.h"
 #include "qm_rps/codes/concretelaw.h"
 #include "qm_rps/codes/confinement.h"
 #include "qm_rps/outline/sectionoutline.h"
@@ -206,6 +207,16 @@ T_SECTION_MODEL ConcreteModel(const T_SECT_D& s, const T_SECTION_STRENGTHS& f,
     return model;
 }
 
+/// Loads along z that pass elsewhere twist a channel, which nothing here counts.
+void TellShearCentre(const T_SECT_D& s, CCodeSheet& sheet)
+{
+    if (s.shape != SECT_SHAPE::Channel) return;
+    const T_CHANNEL c = ChannelProperties(s);
+    sheet.Put("yS", c.shearCentre - c.centroid, kDimLength, "",
+              "shear centre from the centroid, along y", K);
+    sheet.Warn("IDS_QM_SECC_WARN_CHANNEL", {s.name});
+}
+
 T_SECTION_MODEL SteelModel(const T_SECT_D& s, const T_SECTION_STRENGTHS& f,
                            const T_SECTION_OPTIONS& o, bool strains, CCodeSheet& sheet)
 {
@@ -238,6 +249,7 @@ std::optional<T_SECTION_MODEL> SectionModelOf(const T_SECT_D& s, const T_MATL_D&
         sheet.Refuse(CODE_REASON::Missing, "shape", s.name);
         return {};
     }
+    TellShearCentre(s, sheet);
     const T_SECTION_MODEL model = m.type == MATL_CLASS::Concrete
                                       ? ConcreteModel(s, *f, o, sheet)
                                       : SteelModel(s, *f, o, strains, sheet);

@@ -1,4 +1,5 @@
 // How steel sections are checked beside the section calculator.
+#include "qm_db/sectionproperties.h"
 #include "qm_rps/codes/en1993class.h"
 #include "qm_rps/generate/steelmember.h"
 #include "qm_rps/section/sectionways.h"
@@ -138,14 +139,25 @@ std::optional<double> EnShearY(const T_CHECK_JOB& job, const T_SECTION_FORCES& f
     return EnShearAlong(job, f.Vy, false, sheet);
 }
 
+/// AISC 360 F6.1 about the weak axis: that of an I is below the limit by itself.
+void LimitWeakAxis(const T_CHECK_JOB& job, T_STEEL_CHECK& c, CCodeSheet& sheet)
+{
+    if (job.section.shape != SECT_SHAPE::Channel) return;
+    const double left = ChannelProperties(job.section).centroid;
+    const double elastic = job.section.Izz / std::max(left, job.section.size[1] - left);
+    c.strength.Mplz = sheet.Put("Mn,z", std::min(c.strength.Mplz, 1.6 * elastic * c.fy), kDimMoment,
+                                "AISC 360 F6.1", "Fy Zy <= 1.6 Fy Sy", R);
+}
+
 // ---- AISC 360, surface --------------------------------------------------------------------------
 
 std::optional<double> Aisc(const T_CHECK_JOB& job, const T_SECTION_FORCES& f, CCodeSheet& sheet,
                            std::string&)
 {
     if (!NotDesign(job, sheet)) return {};
-    const auto c = CheckOf(job, sheet);
+    auto c = CheckOf(job, sheet);
     if (!c || !AiscPlastic(c->shape, c->fy, c->E, f.N > 0.0, true, sheet)) return {};
+    LimitWeakAxis(job, *c, sheet);
     sheet.Warn("IDS_QM_SECK_WARN_NOMINAL", {"AISC 360"});
     return AiscInteraction(c->strength, {f.N, f.My, f.Mz}, sheet);
 }

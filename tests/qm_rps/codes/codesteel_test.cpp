@@ -288,6 +288,11 @@ TEST(SteelInteraction, HandValues)
     ExpectRel(64e-4, *EnShearArea(i, false, sheet), 1e-9, "welded flanges");
     ExpectRel(30.08e-4, *EnShearArea(tube, true, sheet), 1e-9, "RHS");
     ExpectRel(31.8309886e-4, *EnShearArea(pipe, true, sheet), 1e-8, "CHS");
+    // UPN 200 with its flange of 11.16 mm at the middle of what stands out: printed 17.71 cm2.
+    const T_STEEL_SHAPE upn{STEEL_SHAPE::Channel, 32.2e-4, 0.2, 75e-3, 11.16e-3, 8.5e-3, 11.5e-3};
+    ExpectRel(17.71e-4, *EnShearArea(upn, true, sheet), 2e-3, "UPN 200");
+    ExpectRel(0.4 + 0.3 + 0.2, EnAxialBending(upn, unit, {-0.4, 0.3, -0.2}, sheet)->ratio, 1e-9,
+              "channel (6.2)");
     ExpectRel(173.205081e3, *EnPlasticShear(10e-4, 300e6, sheet), 1e-8, "Vpl");
     EXPECT_DOUBLE_EQ(0.0, *EnShearReduction(40, 100, sheet));
     ExpectRel(0.25, *EnShearReduction(-75, 100, sheet), 1e-12, "rho");
@@ -336,6 +341,11 @@ TEST(SteelClass, WorstPartOfTable52)
          1},
         {"box about z: webs are the flanges", shape(RectangularTube, 0.75, 0.01, 0.01), false, 0.0,
          2, 4},
+        // Channel, r = 0: flange (b - tw)/tf; its web at the edge is compressed about z.
+        {"channel: flange 8.8, web 23", shape(Channel, 0.1, 0.01, 0.012), true, 0.0, 1, 1},
+        {"channel: flange 9.6 of 9 and 10", shape(Channel, 0.1, 0.01, 0.004), true, 0.0, 2, 4},
+        {"channel about z: web 35 of 33 and 38", shape(Channel, 0.09, 0.01, 0.008), false, 0.0, 2,
+         2},
         {"tube 300/6 = 50", shape(CircularTube, 0.3, 0.006, 0.006), true, 0.0, 1, 1},
         {"tube 300/4 = 75: 70 and 90", shape(CircularTube, 0.3, 0.004, 0.004), true, 0.0, 3, 3},
     };

@@ -134,6 +134,16 @@ TEST(MemberBasis, FilletsCountInPlatesAndShear)
     box.size = {0.2, 0.1, 8e-3, 8e-3};
     box.fillet = 16e-3;
     EXPECT_NEAR(8e-3, SteelShapeOf(box, sheet)->r, 1e-15);
+    // No code has rows for hinges of channels: never the row of another shape.
+    T_MODEL other = model;
+    other.sections[1].shape = SECT_SHAPE::Channel;
+    for (const HINGE_CODE code : {HINGE_CODE::En1998, HINGE_CODE::Asce17}) {
+        CCodeSheet refused;
+        EXPECT_FALSE(
+            SteelBasis(EndOf(other, Read(other), {code}, HINGE_COMPONENT::My, true, 0.0), refused));
+        ASSERT_TRUE(refused.Fault());
+        EXPECT_EQ("shape: channel", refused.Fault()->member);
+    }
 }
 
 TEST(MemberBasis, WhatBendsLiesBetweenTheRigidOffsets)

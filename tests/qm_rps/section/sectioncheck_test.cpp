@@ -187,6 +187,29 @@ TEST(SectionCheck, BreslerOfTheTextbook)
     EXPECT_NEAR(250.0 / 1228.112, Ratio(check, Axial, ""), 1e-6);
 }
 
+// C10X15.3 of 36 ksi, table values: Zx 15.9, Zy 2.34, Sy 1.15 in3, A 4.48 in2, d tw 2.4 in2. AISC
+// F6 leaves 1.6 Sy about z; EN (6.2) sums.
+TEST(SectionCheck, AChannelByBothCodes)
+{
+    constexpr double kIn3 = 1.6387064e-5, kIn2 = 6.4516e-4, kFy = 248.21e6;
+    T_SECT_D s = *NamedShape("C10X15.3");
+    s.name = "C";
+    T_MATL_D steel = Steel();
+    steel.Fy = kFy;
+    const double N = 0.25 * 4.48 * kIn2 * kFy, My = 0.2 * 15.9 * kIn3 * kFy;
+    const double Mz = 0.3 * 2.34 * kIn3 * kFy, V = 0.4 * 0.6 * 2.4 * kIn2 * kFy;
+    const T_SECTION_CHECK check = Checked(s, steel, {{}, {}, 1.0, {{N, My, Mz, 0, V, 0}}});
+    EXPECT_NEAR(0.25 + 0.2 + 0.3, Ratio(check, Bending, "EN 1993-1-1 6.2.9"), 6e-3);
+    const double weak = 0.3 * 2.34 / (1.6 * 1.15);
+    EXPECT_NEAR(0.25 + 8.0 / 9.0 * (0.2 + weak), Ratio(check, Bending, "AISC 360 H1-1"), 6e-3);
+    EXPECT_NEAR(0.4, Ratio(check, ShearZ, "AISC 360 G"), 1e-3);
+    ASSERT_EQ(1U, std::ranges::count(check.warnings, std::string("IDS_QM_SECC_WARN_CHANNEL"),
+                                     &T_CODE_WARNING::key));
+    // The surface of W shapes is not asked.
+    const T_SECTION_WAY* way = WayOf(check, Bending, "McGuire, Gallagher, Ziemian");
+    EXPECT_TRUE(way && !way->ratio);
+}
+
 TEST(SectionCheck, WhatHasNoAnswerIsNotCheckedWithItsReason)
 {
     T_SECT_D thin = PlatedI();
