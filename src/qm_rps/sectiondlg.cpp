@@ -35,8 +35,9 @@ void CSectionDlg::Read(int key)
     m_section = m_read = std::move(section);
     if (m_section.detailing) m_detail = *m_section.detailing;
     m_bar = -1;
-    m_fillet = 0.0;
+    m_fillet = m_taper = 0.0;
     m_stock.clear();
+    m_family.clear();
 }
 
 std::vector<std::string> CSectionDlg::Names() const
@@ -84,7 +85,13 @@ void CSectionDlg::OnDetailing(bool on)
 
 bool CSectionDlg::HasFillet() const
 {
-    return m_section.shape == SECT_SHAPE::IShape || m_section.shape == SECT_SHAPE::Box;
+    return m_section.shape == SECT_SHAPE::IShape || m_section.shape == SECT_SHAPE::Box ||
+           HasTaper();
+}
+
+bool CSectionDlg::HasTaper() const
+{
+    return m_section.shape == SECT_SHAPE::Channel;
 }
 
 void CSectionDlg::OnShape(SECT_SHAPE shape)
@@ -92,15 +99,64 @@ void CSectionDlg::OnShape(SECT_SHAPE shape)
     if (shape == m_section.shape) return;
     if (shape == SECT_SHAPE::Value) m_section = Calculated();
     m_section.shape = shape;
+    if (HasTaper() != (m_section.taper > 0.0)) std::swap(m_section.taper, m_taper);
     if (HasFillet() == (m_section.fillet > 0.0)) return;
     std::swap(m_section.fillet, m_fillet);
 }
 
-std::vector<std::string> CSectionDlg::StockTexts()
+std::string CSectionDlg::ShearCentreText() const
+{
+    T_SECT_D sound;
+    SECT_FAULT fault = SECT_FAULT::None;
+    if (!HasTaper() || !CSectionProperties::Calc(m_section, sound, fault)) return {};
+    const T_CHANNEL c = ChannelProperties(sound);
+    const auto length = [this](double value) {
+        return FormatText("%.4g", value) + " " + std::string(NameOf(Units().length));
+    };
+    return Say("IDS_QM_UI_SECT_CHANNEL", length(c.centroid), length(-c.shearCentre));
+}
+
+std::vector<std::string> CSectionDlg::FamilyTexts()
+{
+    std::vector<std::string> texts;
+    for (const T_ROLLED_SHAPE& shape : SteelShapes())
+        if (texts.empty() || texts.back() != shape.Family()) texts.push_back(shape.Family());
+    return texts;
+}
+
+/// The rolled shape with these dimensions.
+const T_ROLLED_SHAPE* CSectionDlg::Rolled() const
+{
+    const std::span<const T_ROLLED_SHAPE> all = SteelShapes();
+    const auto at = std::ranges::find_if(all, [this](const auto& s) { return IsStock(s.name); });
+    return at == all.end() ? nullptr : &*at;
+}
+
+std::string CSectionDlg::Family() const
+{
+    if (!m_family.empty()) return m_family;
+    const T_ROLLED_SHAPE* const rolled = Rolled();
+    return rolled ? rolled->Family() : FamilyTexts().front();
+}
+
+int CSectionDlg::FamilyIndex() const
+{
+    const std::vector<std::string> all = FamilyTexts();
+    return static_cast<int>(std::ranges::find(all, Family()) - all.begin());
+}
+
+void CSectionDlg::OnFamily(int index)
+{
+    const std::vector<std::string> all = FamilyTexts();
+    if (index >= 0 && index < std::ssize(all)) m_family = all[static_cast<std::size_t>(index)];
+}
+
+std::vector<std::string> CSectionDlg::StockTexts() const
 {
     std::vector<std::string> texts{Say("IDS_QM_UI_SECT_STOCK_NONE")};
+    const std::string family = Family();
     for (const T_ROLLED_SHAPE& shape : SteelShapes())
-        texts.emplace_back(shape.name);
+        if (shape.Family() == family) texts.push_back(shape.name);
     return texts;
 }
 
@@ -115,28 +171,29 @@ bool CSectionDlg::IsStock(const std::string& name) const
         return std::fabs(a - b) <= kRounding * std::max(std::fabs(a), std::fabs(b));
     };
     return std::ranges::equal(named->size, m_section.size, same) &&
-           same(named->fillet, m_section.fillet);
+           same(named->fillet, m_section.fillet) && same(named->taper, m_section.taper);
 }
 
 int CSectionDlg::StockIndex() const
 {
-    const std::span<const T_ROLLED_SHAPE> all = SteelShapes();
-    const auto at = std::ranges::find_if(
-        all, [this](const T_ROLLED_SHAPE& shape) { return IsStock(shape.name); });
-    return at == all.end() ? 0 : static_cast<int>(at - all.begin()) + 1;
+    const T_ROLLED_SHAPE* const rolled = Rolled();
+    const std::vector<std::string> all = StockTexts();
+    const auto at = rolled ? std::ranges::find(all, rolled->name) : all.end();
+    return at == all.end() ? 0 : static_cast<int>(at - all.begin());
 }
 
 void CSectionDlg::OnStock(int index)
 {
-    if (index > 0 && index <= std::ssize(SteelShapes()))
-        (void)OnStockName(SteelShapes()[static_cast<std::size_t>(index) - 1].name);
+    const std::vector<std::string> all = StockTexts();
+    if (index > 0 && index < std::ssize(all))
+        (void)OnStockName(all[static_cast<std::size_t>(index)]);
 }
 
 std::string CSectionDlg::StockName() const
 {
     if (!m_stock.empty() && IsStock(m_stock)) return m_stock;
-    const int index = StockIndex();
-    return index > 0 ? SteelShapes()[static_cast<std::size_t>(index) - 1].name : std::string();
+    const T_ROLLED_SHAPE* const rolled = Rolled();
+    return rolled ? rolled->name : std::string();
 }
 
 int CSectionDlg::OnStockName(const std::string& name)
@@ -144,16 +201,17 @@ int CSectionDlg::OnStockName(const std::string& name)
     if (name.empty()) return 1; // the dimensions stay
     std::optional<T_SECT_D> named = NamedShape(name);
     if (!named) {
-        ShowMessage("IDS_QM_SECC_NO_SHAPE",
-                    Say("IDS_QM_SECC_NO_SHAPE", name) + ". " + Say("IDS_QM_SECC_HOLLOW"));
+        ShowMessage("IDS_QM_SECC_NO_SHAPE", NoShapeText(name) + ". " + Say("IDS_QM_SECC_HOLLOW"));
         return 0;
     }
     RecordFromSi(*named, Units());
     m_section.shape = named->shape;
     m_section.size = named->size;
     m_section.fillet = named->fillet;
+    m_section.taper = named->taper;
     if (m_key == 0 && m_section.name == m_read.name) m_section.name = name;
     m_stock = name;
+    m_family.clear();
     return 1;
 }
 

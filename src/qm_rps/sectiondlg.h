@@ -27,9 +27,16 @@ public:
     /// given by values starts with those of the shape before.
     void OnShape(SECT_SHAPE shape);
     bool HasFillet() const;
+    bool HasTaper() const; // a channel
+    /// Of a channel: where loads must pass that do not twist it. Empty: there is no such place.
+    std::string ShearCentreText() const;
 
-    /// Rolled shapes of the stock; the first entry stands for any other section.
-    static std::vector<std::string> StockTexts();
+    /// Families of rolled shapes ("IPE"): the one that was chosen, else that of the section.
+    static std::vector<std::string> FamilyTexts();
+    int FamilyIndex() const;
+    void OnFamily(int index);
+    /// Rolled shapes of the family; the first entry stands for any other section.
+    std::vector<std::string> StockTexts() const;
     int StockIndex() const;
     void OnStock(int index);
     /// The rolled shape with these dimensions, or the hollow one that was named; else empty.
@@ -68,6 +75,8 @@ public:
 private:
     bool MayLeave();
     bool IsStock(const std::string& name) const;
+    const T_ROLLED_SHAPE* Rolled() const;
+    std::string Family() const;
     void Read(int key);
     int Store();
 
@@ -76,5 +85,7 @@ private:
     T_SECT_D m_read;        // as it was read
     T_SECT_DETAIL m_detail; // while it is switched off
     double m_fillet = 0.0;  // while the shape can't have one
+    double m_taper = 0.0;   // likewise
+    std::string m_family;   // that was chosen
     std::string m_stock;    // the shape that was named
 };

@@ -165,6 +165,31 @@ TEST_F(StructureWindows, ASteelShapeBringsItsDimensionsAndIsUndone)
     EXPECT_NEAR(0.015, Model().sections.at(1).fillet, 1e-12);
 }
 
+TEST_F(StructureWindows, AChannelIsChosenByItsFamily)
+{
+    ASSERT_TRUE(Open("steel-frame-code-hinges"));
+    ToNewtonAndMillimetre(m_main->Doc());
+    const auto take = [](CDialogWindow& w) {
+        EXPECT_TRUE(Field(w, "taper")->isHidden());
+        const auto choose = [&w](const char* field, const char* text) {
+            ChooseIndex(Field(w, field), qobject_cast<QComboBox*>(Field(w, field))->findText(text));
+        };
+        choose("family", "UPN");
+        EXPECT_EQ("200", TextAt(w, "size1")); // still HEB 200
+        choose("stock", "UPN 200");
+        // DIN 1026-1: 75 x 8.5 x 11.5 with 8 %; 8.5 / 2 nearer to the tip it is 11.16 thick.
+        EXPECT_EQ("75", TextAt(w, "size1"));
+        EXPECT_EQ("11.16", TextAt(w, "size3"));
+        EXPECT_EQ("0.08", TextAt(w, "taper"));
+        EXPECT_NEAR(3220.0, TextAt(w, "A").toDouble(), 5.0);
+        EXPECT_EQ("UPN 200", TextAt(w, "stockName"));
+    };
+    CAnswers answers({CAnswers::Fill(take)});
+    Run("IDS_QM_UI_SECT_MENU");
+    EXPECT_EQ(SECT_SHAPE::Channel, Model().sections.at(1).shape);
+    EXPECT_EQ(0.08, Model().sections.at(1).taper);
+}
+
 TEST_F(StructureWindows, AnUnknownShapeIsRefusedAndChangesNothing)
 {
     ASSERT_TRUE(Open("steel-frame-code-hinges"));

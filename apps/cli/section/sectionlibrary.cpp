@@ -28,6 +28,24 @@ bool Begins(const std::string& name, const std::string& with)
     return plain(name).starts_with(plain(with));
 }
 
+std::vector<std::string> Heads()
+{
+    return {"D1 (mm)",
+            "D2 (mm)",
+            "D3 (mm)",
+            "D4 (mm)",
+            "r (mm)",
+            "A (cm2)",
+            "Iy (cm4)",
+            "Iz (cm4)",
+            "Zy (cm3)",
+            "Zz (cm3)",
+            "yG (mm)",
+            "yS (mm)",
+            Say("IDS_QM_SECC_HEAD_SHAPE")};
+}
+
+/// yG, yS: centroid and shear centre of a channel from the back of its web.
 std::vector<std::string> Row(const std::string& name, const T_SECT_D& shape)
 {
     T_SECT_D s;
@@ -39,6 +57,10 @@ std::vector<std::string> Row(const std::string& name, const T_SECT_D& shape)
     for (const double value :
          {1e3 * s.fillet, 1e4 * s.area, 1e8 * s.Iyy, 1e8 * s.Izz, 1e6 * s.Zy, 1e6 * s.Zz})
         row.push_back(Number(value));
+    const bool channel = s.shape == SECT_SHAPE::Channel;
+    const T_CHANNEL c = channel ? ChannelProperties(s) : T_CHANNEL();
+    row.push_back(channel ? Number(1e3 * c.centroid) : "");
+    row.push_back(channel ? Number(1e3 * c.shearCentre) : "");
     row.push_back(name);
     return row;
 }
@@ -47,16 +69,22 @@ std::vector<std::string> Row(const std::string& name, const T_SECT_D& shape)
 
 EXIT_CODE RunSectionShapes(const std::string& find)
 {
-    T_TABLE_ROWS rows{{"D1 (mm)", "D2 (mm)", "D3 (mm)", "D4 (mm)", "r (mm)", "A (cm2)", "Iy (cm4)",
-                       "Iz (cm4)", "Zy (cm3)", "Zz (cm3)", Say("IDS_QM_SECC_HEAD_SHAPE")}};
+    std::vector<std::pair<std::string, T_TABLE_ROWS>> families;
+    const auto add = [&](const std::string& family, const std::string& name) {
+        if (families.empty() || families.back().first != family)
+            families.emplace_back(family, T_TABLE_ROWS{Heads()});
+        families.back().second.push_back(Row(name, *NamedShape(name)));
+    };
     for (const T_ROLLED_SHAPE& shape : SteelShapes())
-        if (Begins(shape.name, find)) rows.push_back(Row(shape.name, *NamedShape(shape.name)));
-    if (rows.size() == 1) {
-        const std::optional<T_SECT_D> hollow = NamedShape(find);
-        if (!hollow) return Complain(EXIT_CODE::Usage, Say("IDS_QM_SECC_NO_SHAPE", find));
-        rows.push_back(Row(find, *hollow));
+        if (Begins(shape.name, find)) add(shape.Family(), shape.name);
+    if (families.empty()) {
+        if (!NamedShape(find)) return Complain(EXIT_CODE::Usage, NoShapeText(find));
+        add(Say("IDS_QM_SECC_HEAD_SHAPE"), find);
     }
-    const std::string text = TableText(rows) + Say("IDS_QM_SECC_HOLLOW") + "\n";
+    std::string text;
+    for (const auto& [family, rows] : families)
+        text += family + "\n" + TableText(rows) + "\n";
+    text += Say("IDS_QM_SECC_HOLLOW") + "\n" + Say("IDS_QM_SECC_CHANNELS") + "\n";
     std::fwrite(text.data(), 1, text.size(), stdout);
     return EXIT_CODE::Done;
 }

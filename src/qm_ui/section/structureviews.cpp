@@ -19,11 +19,12 @@ const char* SizeKey(SECT_SHAPE shape, std::size_t i)
     constexpr const char *kHeight = "IDS_QM_UI_SECT_HEIGHT", *kWidth = "IDS_QM_UI_SECT_WIDTH",
                          *kDiameter = "IDS_QM_UI_SECT_OUTER", *kWall = "IDS_QM_UI_SECT_WALL",
                          *kWeb = "IDS_QM_UI_SECT_WEB", *kFlange = "IDS_QM_UI_SECT_FLANGE";
-    constexpr std::array<std::array<const char*, kSizes>, 6> kKeys{
+    constexpr std::array<std::array<const char*, kSizes>, 7> kKeys{
         {{},
          {kHeight, kWidth},
          {kDiameter},
          {kDiameter, kWall},
+         {kHeight, kWidth, kWeb, kFlange},
          {kHeight, kWidth, kWeb, kFlange},
          {kHeight, kWidth, kWeb, kFlange}}};
     return kKeys[static_cast<std::size_t>(shape)][i];
@@ -37,7 +38,7 @@ void AddDimensions(CFormView& form, CSectionDlg& d)
                  [&d](const int& index) { d.OnShape(static_cast<SECT_SHAPE>(index)); }},
                 KeyTexts({"IDS_QM_UI_SHAPE_VALUE", "IDS_QM_UI_SHAPE_RECTANGLE",
                           "IDS_QM_UI_SHAPE_CIRCLE", "IDS_QM_UI_SHAPE_PIPE", "IDS_QM_UI_SHAPE_BOX",
-                          "IDS_QM_UI_SHAPE_I"}))
+                          "IDS_QM_UI_SHAPE_I", "IDS_QM_UI_SHAPE_CHANNEL"}))
         .name = "shape";
     for (std::size_t i = 0; i < kSizes; ++i) {
         CFormField& field = form.Number(
@@ -53,10 +54,19 @@ void AddDimensions(CFormView& form, CSectionDlg& d)
         form.Number(Head(d, "IDS_QM_UI_SECT_FILLET", kDimLength), Ref(d.m_section.fillet));
     fillet.name = "fillet";
     fillet.shown = [&d] { return d.HasFillet(); };
+    CFormField& taper = form.Number(KeyText("IDS_QM_UI_SECT_TAPER"), Ref(d.m_section.taper));
+    taper.name = "taper";
+    taper.shown = [&d] { return d.HasTaper(); };
+    CFormField& note = form.Note([&d] { return d.ShearCentreText(); });
+    note.shown = [&d] { return d.HasTaper(); };
     form.Group(KeyText("IDS_QM_UI_SECT_STOCK"));
+    form.Choice(KeyText("IDS_QM_UI_SECT_STOCK_FAMILY"),
+                {[&d] { return d.FamilyIndex(); }, [&d](const int& index) { d.OnFamily(index); }},
+                [] { return CSectionDlg::FamilyTexts(); })
+        .name = "family";
     form.Choice(KeyText("IDS_QM_UI_SECT_STOCK_ROLLED"),
                 {[&d] { return d.StockIndex(); }, [&d](const int& index) { d.OnStock(index); }},
-                [] { return CSectionDlg::StockTexts(); })
+                [&d] { return d.StockTexts(); })
         .name = "stock";
     form.Text(KeyText("IDS_QM_UI_SECT_STOCK_NAME"),
               {[&d] { return d.StockName(); },
