@@ -69,9 +69,14 @@ public:
         }
         path.displacement.push_back(step.run.displacement[step.step]);
         path.baseReaction.push_back(step.run.baseReaction[step.step]);
-        std::vector<T_END_STATE>& states = path.ends.emplace_back();
-        for (const T_JUDGED_END& end : ends)
-            states.push_back(StateOf(end, step));
+        std::vector<T_END_STATE> states;
+        for (const T_JUDGED_END& end : ends) {
+            T_END_STATE& s = states.emplace_back(StateOf(end, step));
+            s.largestV = std::fabs(s.V);
+            if (!path.ends.empty())
+                s.largestV = std::max(s.largestV, path.ends.back()[states.size() - 1].largestV);
+        }
+        path.ends.push_back(std::move(states));
     }
 
     std::vector<T_JUDGED_END> ends;

@@ -19,10 +19,11 @@ struct T_END_STATE : T_END_FORCES {
                          // of a brace its elongation
     double flowed = 0.0; // deformation of the hinge at the end, 0 without one
     double hingeMoment = 0.0; // of a brace: force
+    double largestV = 0.0;    // magnitude, up to this state
 };
-inline constexpr std::array<double T_END_STATE::*, 7> kEndStateMembers{
+inline constexpr std::array<double T_END_STATE::*, 8> kEndStateMembers{
     &T_END_STATE::N,     &T_END_STATE::M,      &T_END_STATE::V,          &T_END_STATE::across,
-    &T_END_STATE::chord, &T_END_STATE::flowed, &T_END_STATE::hingeMoment};
+    &T_END_STATE::chord, &T_END_STATE::flowed, &T_END_STATE::hingeMoment, &T_END_STATE::largestV};
 /// On the straight line from a (0) to b (1); beyond them too.
 T_END_STATE Between(const T_END_STATE& a, const T_END_STATE& b, double at);
 

@@ -197,12 +197,21 @@ void PlasticRotations(const T_CHECKING& c, double axial)
     CCodeSheet span, sheet;
     T_MEMBER_END member = ShearEnd(c.end, c.state, span);
     member.axial = axial;
-    if (const double V = std::fabs(c.state.V); V > 0.0) member.pushed = {V, member.ShearSpan()};
+    // The rows of tables take the V that the member was designed to have: it does not fall again
+    // with the strength of its hinges.
+    const double V = std::max(c.state.largestV, std::fabs(c.state.V));
+    if (V > 0.0) member.pushed = {V, member.ShearSpan()};
     const auto side = GeneratedSide(member, IsPositiveSide(c.end, c.state), check.why);
     if (!side) return;
     check.trace = side->trace;
     check.trace.insert(check.trace.end(), span.Trace().begin(), span.Trace().end());
     c.out.warnings = side->warnings;
+    const auto none = std::ranges::find(side->warnings, std::string("IDS_QM_CODE_WARN_NO_LATERAL"),
+                                        &T_CODE_WARNING::key);
+    if (none != side->warnings.end()) {
+        check.why = WarningText(*none);
+        return;
+    }
     c.out.LV = member.shearSpan;
     c.out.thetaY = side->bone.yieldDeform;
     const T_END_STATE& s = c.state;

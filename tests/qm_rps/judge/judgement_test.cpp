@@ -162,6 +162,19 @@ TEST(Judgement, ShearSpanStaysWithinTheMember)
     }
 }
 
+// V of the tables is the largest up to the state: a hinge that has lost its strength, and with it
+// the shear, does not get the row of a small V.
+TEST(Judgement, RowsOfTablesKeepTheShearThatWas)
+{
+    T_END_STATE full = State(0.02, 60.0 * kN), lost = State(0.03, 15.0 * kN);
+    full.largestV = lost.largestV = 60.0 * kN;
+    const T_JUDGED_END end = Column(HINGE_CODE::Asce13);
+    const T_END_CHECKS before = Checked(end, full), after = Checked(end, lost);
+    EXPECT_DOUBLE_EQ(before.At(kRotation, 2)->capacity, after.At(kRotation, 2)->capacity);
+    lost.largestV = 15.0 * kN;
+    EXPECT_LT(before.At(kRotation, 2)->capacity, Checked(end, lost).At(kRotation, 2)->capacity);
+}
+
 // The top of a cantilever is not bent; a hinge that has lost its moment has turned; the foot of a
 // wall has its point without moment beyond the storey: 90 kNm over 12 m of 32 MNm2.
 TEST(Judgement, EndTurnsAgainstItsChordToTheShearSpan)
