@@ -5,6 +5,7 @@
 #include "qm_ui/plot/plotwidget.h"
 
 #include <QComboBox>
+#include <QCheckBox>
 #include <QFile>
 
 using namespace desktop_test;
@@ -88,7 +89,7 @@ TEST_F(DesktopTest, GivenForcesAreCheckedTracedAndExported)
         EXPECT_TRUE(sets.setData(sets.index(1, 1), "400"));
         EXPECT_TRUE(sets.setData(sets.index(1, 2), "160"));
         EXPECT_EQ("EXCEEDED", Cell(ways, ofOne + 1, 4));
-        Check(w, "check.byRatio");
+        qobject_cast<QCheckBox*>(Field(w, "check.byRatio"))->click();
         EXPECT_EQ("more", Cell(ways, 0, 0)); // the worse set first
         const int all = ways.rowCount();
         ChooseIndex(Field(w, "check.code"), 1); // EN alone

@@ -1,4 +1,5 @@
 // Piers of masonry, walls and round columns of concrete in a state of a push, by hand.
+#include "qm_db/sectionproperties.h"
 #include "qm_rps/judge/judgedend.h"
 
 #include <gtest/gtest.h>
@@ -166,4 +167,42 @@ TEST(JudgedMaterials, RoundColumnsAreNotTakenForRectangles)
         EXPECT_NE("EN 1998-3 (A.1)", line.clause);
     EXPECT_FALSE(checks.At(kShear, 2));
     EXPECT_NE("", checks.Of(kShear)->why);
+}
+
+// Beam 300 x 500, bars alike above and below: rho - rho' = 0. Table 10-7, CP: 0.05 where V/(bw d
+// sqrt f'c) is at most 3 and the stirrups conform; 0.015 above 6 where they do not: 3/4 of 400 kN
+// is more than Av fy d/s = 100.5 mm2 450 MPa 0.453/0.15 = 137 kN. kappa is the same in both.
+TEST(JudgedMaterials, RowOfABeamGoesByTheShearOfTheState)
+{
+    T_JUDGED_END end = OfConcrete(HINGE_CODE::Asce17, MEMBER_KIND::Beam);
+    end.member.clear = 4.6;
+    end.member.section.shape = SECT_SHAPE::Rectangle;
+    end.member.section.size = {0.5, 0.3, 0.0, 0.0};
+    for (const double y : {-0.1, 0.0, 0.1})
+        for (const double z : {-0.203, 0.203})
+            end.member.section.bars.push_back({y, z, 254.469e-6});
+    SECT_FAULT fault = SECT_FAULT::None;
+    ASSERT_TRUE(CSectionProperties::Calc(end.member.section, end.member.section, fault));
+    const auto low = Checked(end, 0.0, 20 * kN, 0.0).At(kRotation, 2);
+    const auto high = Checked(end, 0.0, 400 * kN, 0.0).At(kRotation, 2);
+    ASSERT_TRUE(low && high);
+    EXPECT_NEAR(0.015 / 0.05, high->capacity / low->capacity, 1e-9);
+}
+
+// The codes' limits of connections are not known here: no verdict is given on their rotation.
+TEST(JudgedMaterials, RotationOfABeamWithAConnectionIsNotChecked)
+{
+    T_JUDGED_END end = Foot(HINGE_CODE::Asce17, MEMBER_KIND::Beam);
+    end.member.section.shape = SECT_SHAPE::IShape;
+    end.member.section.size = {0.3, 0.15, 0.0071, 0.0107};
+    SECT_FAULT fault = SECT_FAULT::None;
+    ASSERT_TRUE(CSectionProperties::Calc(end.member.section, end.member.section, fault));
+    end.member.material.E = 210e9, end.member.material.Fy = 275e6;
+    EXPECT_TRUE(Checked(end, 0.0, 20 * kN, 0.0).At(kRotation, 0));
+    end.member.connection = T_STEEL_CONNECTION{"RBS", 0.015, 0.0107, 0.75};
+    const T_END_CHECKS checks = Checked(end, 0.0, 20 * kN, 0.0);
+    for (std::size_t level = 0; level < kLevels; ++level)
+        EXPECT_FALSE(checks.At(kRotation, level));
+    EXPECT_FALSE(checks.Of(kRotation)->why.empty());
+    EXPECT_TRUE(checks.At(kShear, 0)); // the web is checked all the same
 }
