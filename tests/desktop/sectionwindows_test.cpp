@@ -4,8 +4,8 @@
 #include "qm_rps/section/sectionvalues.h"
 #include "qm_ui/plot/plotwidget.h"
 
-#include <QComboBox>
 #include <QCheckBox>
+#include <QComboBox>
 #include <QFile>
 
 using namespace desktop_test;
