@@ -4,9 +4,11 @@
 
 #include <QApplication>
 #include <QLabel>
+#include <QProgressDialog>
 #include <QPushButton>
 
 #include <algorithm>
+#include <utility>
 
 namespace desktop_test {
 
@@ -30,7 +32,8 @@ CPlay::~CPlay()
 void CPlay::Look()
 {
     QWidget* window = QApplication::activeModalWidget();
-    if (m_pending || !window || !window->isVisible()) return;
+    if (m_pending || !window || window == m_acting || !window->isVisible()) return;
+    if (qobject_cast<QProgressDialog*>(window)) return; // goes by itself
     if (auto* box = qobject_cast<QMessageBox*>(window)) return Answer(*box);
     auto* dialog = dynamic_cast<CDialogWindow*>(window);
     constexpr int kMostMs = 60000;
@@ -47,7 +50,9 @@ void CPlay::Look()
     m_pending = true; // windows that the act opens have their own loop
     Later(dialog, [this, dialog, act = scene.act] {
         m_pending = false;
+        const QWidget* const before = std::exchange(m_acting, dialog);
         act(*dialog);
+        m_acting = before;
     });
 }
 

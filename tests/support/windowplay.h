@@ -38,7 +38,8 @@ private:
 
     std::vector<T_SCENE> m_scenes;
     std::size_t m_next = 0;
-    QPointer<QMessageBox> m_box; // answered last
+    QPointer<QMessageBox> m_box;       // answered last
+    const QWidget* m_acting = nullptr; // whose act runs: work in it may look after events
     bool m_pending = false;
     QTimer m_timer;
     QElapsedTimer m_clock;
