@@ -123,18 +123,20 @@ void AddForces(CFormView& form, DLG& d)
     form.Columns();
     const auto button = [&form](const char* key, const std::function<void()>& pressed) {
         form.Button(KeyText(key), pressed).name = key;
-        form.NextColumn();
     };
     button("IDS_QM_UI_SECK_NEW", [&d] { d.OnNewSet(); });
+    form.NextColumn();
     button("IDS_QM_UI_SECK_DELETE", [&d] { d.OnDeleteSet(); });
+    form.NextColumn();
     button("IDS_QM_UI_SECK_READ", [&d] { (void)d.OnReadSets(); });
+    form.EndColumns();
+    form.Columns();
     form.Choice(KeyText("IDS_QM_UI_SECK_CASE"), Ref(d.m_loadCase), [&d] { return d.LoadCases(); })
         .name = "check.case";
     form.NextColumn();
     form.Text(KeyText("IDS_QM_UI_SECK_ELEMENTS"), Ref(d.m_elements)).name = "check.elements";
     form.NextColumn();
-    form.Button(KeyText("IDS_QM_UI_SECK_TAKE"), [&d] { (void)d.OnTakeResults(); }).name =
-        "IDS_QM_UI_SECK_TAKE";
+    button("IDS_QM_UI_SECK_TAKE", [&d] { (void)d.OnTakeResults(); });
     form.EndColumns();
     form.Columns();
     form.Choice(KeyText("IDS_QM_UI_SECK_CODE"), Member(d, d.m_checkCode),
