@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <cctype>
+#include <cmath>
 #include <iterator>
 #include <vector>
 
@@ -151,12 +152,31 @@ std::optional<T_STOCK_SHAPE> Hollow(const std::string& plain)
     return T_STOCK_SHAPE{STOCK_SHAPE::Box, {height, width, wall, wall}, corner};
 }
 
+/// "IPE" of "IPE 300".
+std::string Letters(const std::string& name)
+{
+    const auto letter = [](char c) { return c >= 'A' && c <= 'Z'; };
+    return {name.begin(), std::ranges::find_if_not(name, letter)};
+}
+
+/// How far the numbers of two names of a family lie apart; empty: they are not of one.
+std::vector<double> Apart(const std::string& a, const std::string& b)
+{
+    const std::string family = Letters(a);
+    if (family != Letters(b)) return {};
+    const std::vector<double> p = Dimensions(a.substr(family.size()));
+    const std::vector<double> q = Dimensions(b.substr(family.size()));
+    std::vector<double> out;
+    for (std::size_t i = 0; p.size() == q.size() && i < p.size(); ++i)
+        out.push_back(std::fabs(p[i] - q[i]));
+    return out;
+}
+
 } // namespace
 
 std::string T_ROLLED_SHAPE::Family() const
 {
-    const auto letter = [](char c) { return c >= 'A' && c <= 'Z'; };
-    return {name.begin(), std::ranges::find_if_not(name, letter)};
+    return Letters(name);
 }
 
 std::span<const T_ROLLED_SHAPE> SteelShapes()
@@ -186,9 +206,16 @@ std::optional<T_STOCK_SHAPE> FindShape(const std::string& name)
 std::string NearestShape(const std::string& name)
 {
     std::vector<std::string_view> names;
-    for (const T_ROLLED_SHAPE& s : SteelShapes())
+    std::vector<double> least;
+    std::string_view nearest;
+    for (const T_ROLLED_SHAPE& s : SteelShapes()) {
         names.push_back(s.name);
-    return NearestName(name, names);
+        const std::vector<double> apart = Apart(Plain(name), Plain(s.name));
+        if (apart.empty() || (!least.empty() && !(apart < least))) continue;
+        least = apart;
+        nearest = s.name;
+    }
+    return nearest.empty() ? NearestName(name, names) : std::string(nearest);
 }
 
 std::string NoShapeText(const std::string& name)

@@ -31,7 +31,8 @@ std::span<const T_ROLLED_SHAPE> SteelShapes();
 /// thicker ones). Blanks and case do not matter. None: there is no such shape.
 std::optional<T_STOCK_SHAPE> FindShape(const std::string& name);
 
-/// The rolled shape whose name is the nearest to this one; empty: none is near.
+/// The rolled shape of the family whose numbers are the nearest to those of the name, height first;
+/// without such a family the one with the nearest name. Empty: none is near.
 std::string NearestShape(const std::string& name);
 /// That there is no such shape, and which one is near.
 std::string NoShapeText(const std::string& name);
