@@ -65,17 +65,58 @@ double EnImperfection(const T_STEEL_SHAPE& s, bool minor, CCodeSheet& sheet)
         R);
 }
 
-std::optional<double> EnBuckling(const T_BUCKLING& b, double imperfection, CCodeSheet& sheet)
+std::optional<T_EN_BUCKLED> EnBuckled(const T_BUCKLING& b, double imperfection, CCodeSheet& sheet)
 {
     if (!Sound(b, sheet) || !sheet.NotNegative({{"imperfection", imperfection}})) return {};
-    const double slender = sheet.Put("lambda", b.length / b.radius / (kPi * std::sqrt(b.E / b.fy)),
-                                     kEn, "(K L/i)/(pi sqrt(E/fy))", R);
-    const double phi = 0.5 * (1.0 + imperfection * (slender - 0.2) + slender * slender);
-    const double chi =
-        slender <= 0.2 ? 1.0 : 1.0 / (phi + std::sqrt(phi * phi - slender * slender));
-    sheet.Put("chi", std::min(1.0, chi), kEn,
-              "1/(Phi + sqrt(Phi^2 - l^2)) <= 1, Phi = 0.5 (1 + alpha (l - 0.2) + l^2)", R);
-    return sheet.Put("Nb", std::min(1.0, chi) * b.area * b.fy, kDimForce, kEn, "chi A fy", R);
+    const double area = b.counted > 0.0 ? b.counted : b.area;
+    T_EN_BUCKLED out;
+    out.slenderness = sheet.Put(
+        "lambda", std::sqrt(area / b.area) * b.length / b.radius / (kPi * std::sqrt(b.E / b.fy)),
+        kEn, area < b.area ? "sqrt(Aeff/A) (K L/i)/(pi sqrt(E/fy))" : "(K L/i)/(pi sqrt(E/fy))", R);
+    const double l = out.slenderness, phi = 0.5 * (1.0 + imperfection * (l - 0.2) + l * l);
+    const double chi = l <= 0.2 ? 1.0 : 1.0 / (phi + std::sqrt(phi * phi - l * l));
+    out.chi =
+        sheet.Put("chi", std::min(1.0, chi), kEn,
+                  "1/(Phi + sqrt(Phi^2 - l^2)) <= 1, Phi = 0.5 (1 + alpha (l - 0.2) + l^2)", R);
+    out.strength = sheet.Put("Nb", out.chi * area * b.fy, kDimForce, kEn,
+                             area < b.area ? "chi Aeff fy" : "chi A fy", R);
+    return out;
+}
+
+std::optional<double> EnBuckling(const T_BUCKLING& b, double imperfection, CCodeSheet& sheet)
+{
+    const auto buckled = EnBuckled(b, imperfection, sheet);
+    return buckled ? std::optional(buckled->strength) : std::nullopt;
+}
+
+std::optional<double> EnBeamColumn(const T_EN_BEAM_COLUMN& c, const T_STEEL_FORCES& f,
+                                   CCodeSheet& sheet)
+{
+    constexpr const char* kTable = "EN 1993-1-1 Table B.1";
+    constexpr const char* kClause = "EN 1993-1-1 6.3.3";
+    constexpr double kCm = 0.9;
+    sheet.Positive({{"My", c.My}, {"Mz", c.Mz}, {"Nb,y", c.y.strength}, {"Nb,z", c.z.strength}});
+    if (!sheet.Finite({{"N", f.N}, {"My", f.My}, {"Mz", f.Mz}})) return {};
+    const bool isI = c.shape == STEEL_SHAPE::RolledI || c.shape == STEEL_SHAPE::WeldedI;
+    const double ny = f.N / c.y.strength, nz = f.N / c.z.strength;
+    const auto factor = [&](const char* symbol, double l, double n, bool minorOfI) {
+        const double grows = !c.plastic ? 0.6 * std::min(l, 1.0)
+                             : minorOfI ? std::min(2.0 * l - 0.6, 1.4)
+                                        : std::min(l - 0.2, 0.8);
+        return sheet.Put(symbol, kCm * (1.0 + grows * n), kTable,
+                         !c.plastic ? "0.9 (1 + 0.6 l n), l <= 1; Cm = 0.9: sway"
+                         : minorOfI ? "0.9 (1 + (2 l - 0.6) n), l <= 1; Cm = 0.9: sway"
+                                    : "0.9 (1 + (l - 0.2) n), l <= 1; Cm = 0.9: sway",
+                         R);
+    };
+    const double kyy = factor("kyy", c.y.slenderness, ny, false);
+    const double kzz = factor("kzz", c.z.slenderness, nz, isI);
+    const double my = std::fabs(f.My) / c.My, mz = std::fabs(f.Mz) / c.Mz;
+    const double first = sheet.Put("(6.61)", ny + kyy * my + (c.plastic ? 0.6 : 1.0) * kzz * mz,
+                                   kClause, "N/Nb,y + kyy My/My,Rk + kyz Mz/Mz,Rk, chi_LT = 1", R);
+    const double second = sheet.Put("(6.62)", nz + (c.plastic ? 0.6 : 0.8) * kyy * my + kzz * mz,
+                                    kClause, "N/Nb,z + kzy My/My,Rk + kzz Mz/Mz,Rk, chi_LT = 1", R);
+    return std::max(first, second);
 }
 
 std::optional<double> AiscBuckling(const T_BUCKLING& b, CCodeSheet& sheet)

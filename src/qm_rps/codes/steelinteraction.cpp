@@ -173,6 +173,15 @@ std::optional<T_EN_INTERACTION> EnAxialBending(const T_STEEL_SHAPE& s,
     return sheet.Sound() ? std::optional(e) : std::nullopt;
 }
 
+std::optional<double> EnElasticBending(const T_STEEL_PLASTIC_STRENGTH& r, const T_STEEL_FORCES& f,
+                                       CCodeSheet& sheet)
+{
+    if (!SoundForces(r, f, sheet)) return {};
+    return sheet.Put("ratio",
+                     std::fabs(f.N) / r.Npl + std::fabs(f.My) / r.Mply + std::fabs(f.Mz) / r.Mplz,
+                     "EN 1993-1-1 6.2.9.2", "N/(A fy) + My/(Wel,y fy) + Mz/(Wel,z fy)", R);
+}
+
 std::optional<double> AiscInteraction(const T_STEEL_PLASTIC_STRENGTH& available,
                                       const T_STEEL_FORCES& f, CCodeSheet& sheet)
 {

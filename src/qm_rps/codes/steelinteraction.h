@@ -38,6 +38,10 @@ std::optional<T_EN_INTERACTION> EnAxialBending(const T_STEEL_SHAPE& s,
                                                const T_STEEL_PLASTIC_STRENGTH& r,
                                                const T_STEEL_FORCES& f, CCodeSheet& sheet);
 
+/// 6.2.9.2, sections of class 3, with A fy and the elastic moments: the ratio.
+std::optional<double> EnElasticBending(const T_STEEL_PLASTIC_STRENGTH& elastic,
+                                       const T_STEEL_FORCES& f, CCodeSheet& sheet);
+
 /// AISC 360 H1-1 with the available strengths: the ratio.
 std::optional<double> AiscInteraction(const T_STEEL_PLASTIC_STRENGTH& available,
                                       const T_STEEL_FORCES& f, CCodeSheet& sheet);

@@ -39,6 +39,8 @@ double SpanChordDemand(const T_CHECKING& c, const T_MEMBER_END& member, CCodeShe
 double ChordDemand(const T_CHECKING& c, const T_MEMBER_END& member, CCodeSheet& sheet);
 /// |chord rotation| against DL, SD, NC of the hinge that the code gives.
 void GeneratedChord(const T_CHECKING& c);
+/// Of a hinge beyond yield, without what turns elastically in series; 0: rounding.
+double PlasticRotationOf(const T_JUDGED_END& end, const T_END_STATE& s);
 /// Plastic rotation against kappa times IO, LS, CP of the hinge that the code gives at an axial
 /// force.
 void PlasticRotations(const T_CHECKING& c, double axial);

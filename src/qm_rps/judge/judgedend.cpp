@@ -191,6 +191,14 @@ void GeneratedChord(const T_CHECKING& c)
     Keep(sheet, check, c.out);
 }
 
+double PlasticRotationOf(const T_JUDGED_END& end, const T_END_STATE& s)
+{
+    constexpr double kNothing = 1e-9; // rad
+    const double elastic = end.spring > 0.0 ? s.hingeMoment / end.spring : 0.0;
+    const double turned = std::fabs(s.flowed - elastic);
+    return turned > kNothing ? turned : 0.0;
+}
+
 void PlasticRotations(const T_CHECKING& c, double axial)
 {
     T_MODE_CHECK& check = c.Of(JUDGE_MODE::Rotation);
@@ -214,9 +222,7 @@ void PlasticRotations(const T_CHECKING& c, double axial)
     }
     c.out.LV = member.shearSpan;
     c.out.thetaY = side->bone.yieldDeform;
-    const T_END_STATE& s = c.state;
-    const double elastic = c.end.spring > 0.0 ? s.hingeMoment / c.end.spring : 0.0;
-    const double theta = sheet.Put("theta_pl", std::fabs(s.flowed - elastic), "",
+    const double theta = sheet.Put("theta_pl", PlasticRotationOf(c.end, c.state), "",
                                    "rotation of the hinge beyond yield", K);
     const double kappa = KappaOf(member.material, sheet);
     for (std::size_t i = 0; i < kLevels; ++i) {

@@ -20,7 +20,7 @@ inline constexpr std::array<T_LEVELS, 3> kLevelNames{
     {{"IO", "LS", "CP"}, {"DL", "SD", "NC"}, {"SLD", "SLV", "SLC"}}};
 
 /// Rotation and shear of member ends, of steel columns the axial force (with bending where no
-/// rotation may be counted on); the elongation of braces; the shear of joints.
+/// plastic rotation may be counted on); the elongation of braces; the shear of joints.
 enum class JUDGE_MODE { Rotation, Shear, Axial, Elongation, Joint };
 inline constexpr std::size_t kModes = 5;
 inline constexpr std::array<const char*, kModes> kModeNames{"rotation", "shear", "axial_force",
@@ -113,7 +113,8 @@ std::vector<JUDGE_MODE> ModesOf(const T_JUDGED_END& end);
 /// Shear: EN 1998-3 (A.12) with the strengths over CF and gamma_M, at the ductility theta / theta_y
 /// of the state, VRd,max of EN 1992-1-1; steel EN 1993-1-1 6.2.6. ASCE 41-17 7.5.3.2: gamma chi
 /// (V - VG) + VG against kappa times the strength with lower-bound strengths.
-/// Axial force of steel columns: buckling; where the code counts on no rotation AISC 360 H1-1,
-/// EN 1993-1-1 6.2.9 instead of rotations. Joints: CheckJoint.
+/// Axial force of steel columns: buckling; where the code counts on no rotation with the moments,
+/// AISC 360 H1-1 or EN 1993-1-1 6.2.9 and 6.3.3, and what the hinge has turned against 0. Joints:
+/// CheckJoint.
 T_END_CHECKS CheckEnd(const T_JUDGED_END& end, const T_END_STATE& state,
                       const T_STATE_CONTEXT& with);

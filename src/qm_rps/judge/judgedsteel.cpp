@@ -1,9 +1,9 @@
 // Members of steel: EN 1998-3 Annex B with EN 1993-1-1, Circolare 2019, ASCE 41 and FEMA 356 with
 // AISC 360.
 #include "qm_base/say.h"
-#include "qm_rps/codes/steelbuckling.h"
 #include "qm_rps/generate/rcend.h"
 #include "qm_rps/generate/steelhinge.h"
+#include "qm_rps/judge/encolumn.h"
 #include "qm_rps/judge/judgedchecks.h"
 
 #include <algorithm>
@@ -97,28 +97,20 @@ bool EnAxial(const T_CHECKING& c, const T_STEEL_BASIS& in, bool withMoments, CCo
 {
     T_MODE_CHECK& check = c.Of(Axial);
     const T_END_STATE& s = c.with.brittle;
-    const auto buckled =
-        EnBuckling(BucklingOf(in, in.fy), EnImperfection(in.shape, in.iz <= in.iy, sheet), sheet);
+    const auto buckled = EnColumnBuckled(in, in.iz > in.iy, sheet);
     if (!buckled) return FillWhy(check, sheet);
     const double pressed = std::max(0.0, s.N);
-    check.clause.fill("EN 1993-1-1 6.3.1");
-    if (!withMoments) {
-        check.at.fill(T_CHECK{pressed, *buckled});
+    if (!withMoments || pressed > buckled->strength) { // nothing is left for moments
+        check.clause.fill("EN 1993-1-1 6.3.1");
+        check.at.fill(T_CHECK{pressed, buckled->strength});
         return true;
     }
-    const double alone =
-        s.N > 0.0 ? sheet.Put("N/Nb", s.N / *buckled, "EN 1993-1-1 6.3.1", "", K)
-                  : sheet.Put("N/Npl", -s.N / in.strength.Npl, "EN 1993-1-1 6.2.3", "", K);
+    const auto both = EnColumn(in, ForcesOf(in.end, s.N, s.M, s.across),
+                               PlasticRotationOf(c.end, s) > 0.0, sheet);
+    if (!both) return FillWhy(check, sheet);
     check.dim = kDimNone;
-    const auto both =
-        EnAxialBending(in.shape, in.strength, ForcesOf(in.end, s.N, s.M, s.across), sheet);
-    if (!both && !(alone > 1.0)) return FillWhy(check, sheet);
-    if (!both) { // nothing is left for moments
-        check.at.fill(T_CHECK{alone, 1.0});
-        return true;
-    }
-    if (both->ratio >= alone) check.clause.fill("EN 1993-1-1 6.2.9.1");
-    check.at.fill(T_CHECK{std::max(both->ratio, alone), 1.0});
+    check.clause.fill(both->clause);
+    check.at.fill(T_CHECK{both->ratio, 1.0});
     return true;
 }
 
@@ -192,6 +184,20 @@ bool CountsOnNoRotation(const T_CHECKING& c)
     return in && std::max(0.0, c.state.N) > kMost * in->strength.Npl;
 }
 
+/// In place of what the code gives: its plastic rotation against none.
+void PutNoRotation(const T_CHECKING& c)
+{
+    T_MODE_CHECK check;
+    check.dim = kDimNone;
+    CCodeSheet sheet;
+    const double turned = sheet.Put("theta_pl", PlasticRotationOf(c.end, c.state), "",
+                                    "of the hinge; under this axial force none is counted on", K);
+    check.at.fill(T_CHECK{turned, 0.0});
+    check.clause.fill(IsChordCode(c.end.By()) ? "EN 1998-3 Annex B" : "ASCE 41 9.4.2.4.2");
+    Keep(sheet, check, c.out);
+    c.Of(Rotation) = std::move(check);
+}
+
 void CheckRotation(const T_CHECKING& c)
 {
     if (IsChordCode(c.end.By())) return GeneratedChord(c);
@@ -216,8 +222,8 @@ void CheckSteel(const T_CHECKING& c)
         c.out.warnings.push_back({kNoSidewaysKey, {}});
     if (!c.out.Of(Axial)) return;
     const bool withMoments = CountsOnNoRotation(c);
-    if (CheckAxial(c, withMoments) && withMoments)
-        std::erase_if(c.out.modes, [](const T_MODE_CHECK& m) { return m.mode == Rotation; });
+    if (withMoments) PutNoRotation(c);
+    (void)CheckAxial(c, withMoments);
 }
 
 void CheckBrace(const T_CHECKING& c)
