@@ -85,7 +85,7 @@ private:
     {
         if (end.joint) {
             w.Member("node", end.joint->node);
-            w.Beside().Member("axis", kAxisNames[end.joint->along]);
+            w.Beside().Member("axis", end.joint->axis);
             return;
         }
         const T_END_PLACE& place = end.place;

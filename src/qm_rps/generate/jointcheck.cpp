@@ -13,7 +13,9 @@ namespace {
 
 using T_VECTOR = std::array<double, 3>;
 constexpr auto K = CODE_MARK::Computed;
-constexpr double kAlong = 0.7071; // cosine of 45 degrees
+constexpr double kSteep = 0.7071;   // cosine of 45 degrees
+constexpr double kInLine = 0.99619; // of five: directions that count as one
+constexpr double kSquare = 0.08716; // of 85: those that count as at right angles
 
 int Fail(std::string& reason, std::string words)
 {
@@ -37,32 +39,56 @@ std::optional<T_VECTOR> WayFrom(const T_MODEL& model, const T_ELEM_D& e, int nod
     return way;
 }
 
+double Dot(const T_VECTOR& a, const T_VECTOR& b)
+{
+    return std::inner_product(a.begin(), a.end(), b.begin(), 0.0);
+}
+
+/// Horizontal direction of a way that is not steep, a unit vector.
+T_VECTOR PlanOf(T_VECTOR way, std::size_t up)
+{
+    way[up] = 0.0;
+    const double length = std::sqrt(Dot(way, way));
+    for (double& w : way)
+        w /= length;
+    return way;
+}
+
 /// Members that meet at a node.
 struct T_MEETING {
-    int above = 0, below = 0;
+    std::vector<int> above, below;
     std::vector<int> ahead, behind, across;
+    bool skewed = false; // a beam neither in the plane nor across it
 
-    bool IsJoint() const
+    bool IsJoint() const { return Column() != 0 && !(ahead.empty() && behind.empty()); }
+    int Above() const { return above.empty() ? 0 : above.front(); }
+    int Column() const { return below.empty() ? Above() : below.front(); }
+    std::vector<int> Beams() const
     {
-        return (above != 0 || below != 0) && !(ahead.empty() && behind.empty());
+        std::vector<int> all = ahead;
+        all.insert(all.end(), behind.begin(), behind.end());
+        return all;
     }
 };
-T_MEETING MeetingAt(const T_MODEL& model, std::span<const int> beams, int node, std::size_t along)
+T_MEETING MeetingAt(const T_MODEL& model, std::span<const int> beams, int node,
+                    const T_VECTOR& along)
 {
     T_MEETING m;
     const std::size_t up = VerticalAxis(model);
     for (const int id : beams) {
-        const T_ELEM_D& e = model.elements.at(id);
-        const auto way = WayFrom(model, e, node);
+        const auto way = WayFrom(model, model.elements.at(id), node);
         if (!way) continue;
-        if ((*way)[up] > kAlong)
-            m.above = id;
-        else if ((*way)[up] < -kAlong)
-            m.below = id;
-        else if (std::fabs((*way)[along]) > kAlong)
-            ((*way)[along] > 0.0 ? m.ahead : m.behind).push_back(id);
-        else
+        if (std::fabs((*way)[up]) > kSteep) {
+            ((*way)[up] > 0.0 ? m.above : m.below).push_back(id);
+            continue;
+        }
+        const double share = Dot(PlanOf(*way, up), along);
+        if (std::fabs(share) > kInLine) {
+            (share > 0.0 ? m.ahead : m.behind).push_back(id);
+        } else {
             m.across.push_back(id);
+            m.skewed = m.skewed || std::fabs(share) > kSquare;
+        }
     }
     return m;
 }
@@ -88,20 +114,32 @@ JOINT_KIND KindOf(const T_MEETING& m)
     const bool interior = !m.ahead.empty() && !m.behind.empty();
     const bool transverse = m.across.size() > 1;
     if (interior) return transverse ? JOINT_KIND::InteriorWithBeams : JOINT_KIND::Interior;
-    if (m.above == 0) return JOINT_KIND::Knee;
+    if (m.above.empty()) return JOINT_KIND::Knee;
     return transverse ? JOINT_KIND::ExteriorWithBeams : JOINT_KIND::Exterior;
 }
 
-/// The horizontal axis is local z of the column, else y. Upright local z is the element's own
-/// vector, else global X.
-bool IsAlongZ(const T_ELEM_D& e, std::size_t along)
+/// Whether the plane runs along local z of the column (else y); empty: along neither. Upright local
+/// z is the element's own vector, else global X.
+std::optional<bool> IsAlongZ(const T_ELEM_D& e, const T_VECTOR& along, std::size_t up)
 {
-    const bool own = e.zAxis != T_VECTOR{};
-    const double z = own ? e.zAxis[along] : (along == 0 ? 1.0 : 0.0);
-    const double size =
-        own ? std::sqrt(std::inner_product(e.zAxis.begin(), e.zAxis.end(), e.zAxis.begin(), 0.0))
-            : 1.0;
-    return std::fabs(z) > kAlong * size;
+    const T_VECTOR z = e.zAxis == T_VECTOR{} ? T_VECTOR{1.0, 0.0, 0.0} : e.zAxis;
+    const double share = std::fabs(Dot(PlanOf(z, up), along));
+    if (share > kInLine) return true;
+    return share < kSquare ? std::optional(false) : std::nullopt;
+}
+
+/// Why these members are no joint that the codes' rules are for; empty: they are.
+std::string FaultOf(const T_MODEL& model, const T_MEETING& m)
+{
+    if (!m.IsJoint() || m.ahead.size() > 1 || m.behind.size() > 1)
+        return Say("IDS_QM_GEN_NO_JOINT");
+    if (m.above.size() > 1 || m.below.size() > 1) return Say("IDS_QM_GEN_JOINT_SEVERAL");
+    for (const auto* posts : {&m.above, &m.below})
+        for (const int post : *posts) {
+            const T_PART part = PartOf(model, post);
+            if (part.section && IsWallSection(*part.section)) return Say("IDS_QM_GEN_JOINT_WALL");
+        }
+    return m.skewed ? Say("IDS_QM_GEN_JOINT_SKEWED") : std::string();
 }
 
 /// Between the outermost bars; 0: there are no two.
@@ -179,28 +217,45 @@ T_NODE_BEAMS BeamsByNode(const T_MODEL& model)
     return out;
 }
 
-T_JOINT_MEMBERS MembersOfJoint(const T_MODEL& model, std::span<const int> beams, int node,
-                               std::size_t along)
+std::vector<T_VECTOR> JointPlanes(const T_MODEL& model, std::span<const int> around, int node)
 {
-    const T_MEETING m = MeetingAt(model, beams, node, along);
-    T_JOINT_MEMBERS out;
-    if (!m.IsJoint()) return out;
-    out.above = m.above;
-    out.column = m.below != 0 ? m.below : m.above;
-    out.beams = m.ahead;
-    out.beams.insert(out.beams.end(), m.behind.begin(), m.behind.end());
-    return out;
+    const std::size_t up = VerticalAxis(model);
+    const std::size_t first = up == 0 ? 1 : 0;
+    std::vector<T_VECTOR> planes;
+    for (const int id : around) {
+        const auto way = WayFrom(model, model.elements.at(id), node);
+        if (!way || std::fabs((*way)[up]) > kSteep) continue;
+        T_VECTOR plan = PlanOf(*way, up);
+        const auto size = [](double a, double b) { return std::fabs(a) < std::fabs(b); };
+        if (*std::ranges::max_element(plan, size) < 0.0)
+            for (double& p : plan)
+                p = 0.0 - p;
+        if (std::ranges::none_of(planes, [&](const T_VECTOR& other) {
+                return std::fabs(Dot(other, plan)) > kInLine;
+            }))
+            planes.push_back(plan);
+    }
+    std::ranges::stable_sort(planes, {},
+                             [first](const T_VECTOR& v) { return -std::fabs(v[first]); });
+    return planes;
 }
 
-int ReadJoint(const T_MODEL& model, std::span<const int> around, int node, std::size_t along,
+T_JOINT_MEMBERS MembersOfJoint(const T_MODEL& model, std::span<const int> beams, int node,
+                               const T_VECTOR& along)
+{
+    const T_MEETING m = MeetingAt(model, beams, node, along);
+    if (!m.IsJoint()) return {};
+    return {m.Above(), m.Column(), m.Beams()};
+}
+
+int ReadJoint(const T_MODEL& model, std::span<const int> around, int node, const T_VECTOR& along,
               HINGE_CODE code, T_JOINT& out, std::string& reason)
 {
     const T_MEETING m = MeetingAt(model, around, node, along);
-    const int column = m.below != 0 ? m.below : m.above;
-    std::vector<int> beams = m.ahead;
-    beams.insert(beams.end(), m.behind.begin(), m.behind.end());
-    if (column == 0 || beams.empty() || m.ahead.size() > 1 || m.behind.size() > 1)
-        return Fail(reason, Say("IDS_QM_GEN_NO_JOINT"));
+    if (std::string fault = FaultOf(model, m); !fault.empty())
+        return Fail(reason, std::move(fault));
+    const int column = m.Column();
+    const std::vector<int> beams = m.Beams();
     const T_PART post = PartOf(model, column);
     if (!post.section) return Fail(reason, Say("IDS_QM_GEN_JOINT_CONCRETE"));
     CCodeSheet sheet;
@@ -215,9 +270,10 @@ int ReadJoint(const T_MODEL& model, std::span<const int> around, int node, std::
     j.fc = j.fcd = material->fc;
     j.lower = post.material->fck > 0.0 ? post.material->fck : material->fc;
     j.columnArea = post.section->size[0] * post.section->size[1];
-    const bool alongZ = IsAlongZ(model.elements.at(column), along);
-    j.hc = post.section->size[alongZ ? 0 : 1];
-    j.hjc = BetweenBars(*post.section, alongZ);
+    const auto alongZ = IsAlongZ(model.elements.at(column), along, VerticalAxis(model));
+    if (!alongZ) return Fail(reason, Say("IDS_QM_GEN_JOINT_TURNED"));
+    j.hc = post.section->size[*alongZ ? 0 : 1];
+    j.hjc = BetweenBars(*post.section, *alongZ);
     double widest = 0.0;
     for (const int beam : beams) {
         const T_PART part = PartOf(model, beam);

@@ -7,7 +7,7 @@
 
 #include <span>
 
-/// A joint in the plane of the vertical and a horizontal axis.
+/// A joint in a vertical plane.
 struct T_JOINT {
     HINGE_CODE code = HINGE_CODE::Asce17;
     int node = 0, column = 0; // element
@@ -26,21 +26,28 @@ struct T_JOINT {
 using T_NODE_BEAMS = std::map<int, std::vector<int>>;
 T_NODE_BEAMS BeamsByNode(const T_MODEL& model);
 
-/// What meets at a node in the plane of the vertical and the axis `along`, within 45 degrees.
+/// Horizontal directions, unit vectors, of the vertical planes that the beams of a node lie in:
+/// beams within five degrees of each other share one. Those nearest to the first horizontal axis
+/// come first; each points along its nearest axis. `around`: the beam elements of the node.
+std::vector<std::array<double, 3>> JointPlanes(const T_MODEL& model, std::span<const int> around,
+                                               int node);
+
+/// What meets at a node in one of its planes.
 struct T_JOINT_MEMBERS {
     int above = 0;          // column; 0: none
     int column = 0;         // below, else above; 0: no column with a beam, so no joint
     std::vector<int> beams; // in the plane
 };
-/// `around`: the beam elements of the node.
 T_JOINT_MEMBERS MembersOfJoint(const T_MODEL& model, std::span<const int> around, int node,
-                               std::size_t along);
+                               const std::array<double, 3>& along);
 
-/// The joint at a node along a global horizontal axis (0: X, 1: Y, 2: Z). Rectangular columns and
-/// beams of concrete with bars. `around`: the beam elements of the node. 1 done; 0 with the reason
-/// in words, `out` unchanged.
+/// The joint at a node in the plane of a direction (JointPlanes). Rectangular columns and beams of
+/// concrete with bars, the column's sides along and across the plane, one column above and below,
+/// all beams in line or at right angles; no walls. 1 done; 0 with the reason in words, `out`
+/// unchanged.
 [[nodiscard]] int ReadJoint(const T_MODEL& model, std::span<const int> around, int node,
-                            std::size_t along, HINGE_CODE code, T_JOINT& out, std::string& reason);
+                            const std::array<double, 3>& along, HINGE_CODE code, T_JOINT& out,
+                            std::string& reason);
 
 struct T_JOINT_DEMAND {
     double beamMoments = 0.0; // sum of the beams' end moments that turn the joint the same way

@@ -2,9 +2,11 @@
 
 #include "qm_base/say.h"
 #include "qm_rps/generate/steeljoint.h"
+#include "qm_rps/judge/vectors.h"
 #include "qm_rps/push/pushstoreys.h"
 
 #include <algorithm>
+#include <cmath>
 #include <map>
 #include <tuple>
 
@@ -262,14 +264,21 @@ public:
     }
     void Add(int node, std::span<const int> around)
     {
-        const std::size_t up = VerticalAxis(m_model);
-        for (std::size_t along = 0; along < kAxisNames.size(); ++along)
-            if (along != up && !m_model.nodes.at(node).restraint[along])
-                AddAlong(node, along, around);
+        for (const T_VECTOR& along : JointPlanes(m_model, around, node))
+            if (!IsHeld(node, along)) AddAlong(node, along, around);
     }
 
 private:
-    void AddAlong(int node, std::size_t along, std::span<const int> around)
+    /// In all axes that the direction has a part of.
+    bool IsHeld(int node, const T_VECTOR& along) const
+    {
+        constexpr double kPart = 0.0872; // sine of five degrees
+        for (std::size_t i = 0; i < along.size(); ++i)
+            if (std::fabs(along[i]) > kPart && !m_model.nodes.at(node).restraint[i]) return false;
+        return true;
+    }
+
+    void AddAlong(int node, const T_VECTOR& along, std::span<const int> around)
     {
         const T_JOINT_MEMBERS members = MembersOfJoint(m_model, around, node, along);
         if (members.column == 0) return;
@@ -284,8 +293,9 @@ private:
         if (isKnown) end.member.material = material->second;
         auto joint = std::make_shared<T_JUDGED_JOINT>();
         joint->node = node;
-        joint->along = along;
-        joint->forth[along] = joint->up[up] = 1.0;
+        joint->forth = along;
+        joint->up[up] = 1.0;
+        joint->axis = PlaneName(along, up);
         std::optional<HINGE_CODE> code = m_options.code ? m_options.code : CodeOf(members);
         const bool hasParts = Place(members, *joint);
         if (!code)

@@ -2,6 +2,9 @@
 
 #include "qm_rps/judge/vectors.h"
 
+#include <cmath>
+#include <numbers>
+
 namespace {
 
 /// What a member does to the node at its end, global.
@@ -36,4 +39,15 @@ T_END_STATE JointState(const T_JUDGED_JOINT& joint, const T_STEP_FORCES& step)
     s.V = -Dot(force, joint.forth);
     s.N = -ForcesAt(joint.above->element, joint.above->atJ, step)[0];
     return s;
+}
+
+std::string PlaneName(const std::array<double, 3>& forth, std::size_t up)
+{
+    constexpr double kTenths = 10.0; // of a degree are told
+    const std::size_t first = up == 0 ? 1 : 0, second = up == 2 ? 1 : 2;
+    double degrees = std::atan2(forth[second], forth[first]) * 180.0 / std::numbers::pi;
+    degrees = std::round(degrees * kTenths) / kTenths;
+    if (degrees == 0.0) return kAxisNames[first];
+    if (degrees == 90.0) return kAxisNames[second];
+    return kAxisNames[first] + std::string(degrees > 0.0 ? "+" : "") + CodeNumber(degrees);
 }

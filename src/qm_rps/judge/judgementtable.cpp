@@ -118,8 +118,7 @@ struct T_PLACE_TEXT {
 T_PLACE_TEXT PlaceOf(const T_JUDGED_END& end)
 {
     if (end.joint)
-        return {Say("IDS_QM_JUDGE_NODE", std::to_string(end.joint->node)), "",
-                kAxisNames[end.joint->along]};
+        return {Say("IDS_QM_JUDGE_NODE", std::to_string(end.joint->node)), "", end.joint->axis};
     return {std::to_string(end.place.element),
             end.kind != JUDGED_KIND::End ? "" : (end.place.atJ ? "J" : "I"),
             end.kind == JUDGED_KIND::Spring

@@ -50,7 +50,10 @@ T_MODEL Frame()
     return m;
 }
 
-int Read(const T_MODEL& model, int node, std::size_t along, HINGE_CODE code, T_JOINT& joint,
+using T_WAY = std::array<double, 3>;
+constexpr T_WAY kX{1, 0, 0}, kY{0, 1, 0};
+
+int Read(const T_MODEL& model, int node, const T_WAY& along, HINGE_CODE code, T_JOINT& joint,
          std::string& reason)
 {
     return ReadJoint(model, BeamsByNode(model)[node], node, along, code, joint, reason);
@@ -78,7 +81,7 @@ TEST(JointCheck, ByEachCode)
         T_JOINT joint;
         T_JOINT_CHECK check;
         std::string reason;
-        ASSERT_EQ(1, Read(Frame(), 5, 0, c.code, joint, reason)) << reason;
+        ASSERT_EQ(1, Read(Frame(), 5, kX, c.code, joint, reason)) << reason;
         EXPECT_EQ(JOINT_KIND::Interior, joint.kind);
         EXPECT_EQ((std::vector<int>{12, 11}), joint.beams);
         ASSERT_EQ(1, CheckJoint(joint, demand, check, reason)) << reason;
@@ -101,18 +104,58 @@ TEST(JointCheck, KindsAndRefusals)
     T_JOINT joint;
     std::string reason;
     T_MODEL model = Frame();
-    ASSERT_EQ(1, Read(model, 8, 0, HINGE_CODE::Asce17, joint, reason));
+    ASSERT_EQ(1, Read(model, 8, kX, HINGE_CODE::Asce17, joint, reason));
     EXPECT_EQ(JOINT_KIND::Knee, joint.kind);
     model.elements.erase(11);
-    ASSERT_EQ(1, Read(model, 5, 0, HINGE_CODE::Asce17, joint, reason));
+    ASSERT_EQ(1, Read(model, 5, kX, HINGE_CODE::Asce17, joint, reason));
     EXPECT_EQ(JOINT_KIND::Exterior, joint.kind);
-    EXPECT_EQ(0, Read(model, 2, 0, HINGE_CODE::Asce17, joint, reason)); // a foot
-    EXPECT_EQ(0, Read(model, 5, 1, HINGE_CODE::Asce17, joint, reason)); // no beams along Y
+    EXPECT_EQ(0, Read(model, 2, kX, HINGE_CODE::Asce17, joint, reason)); // a foot
+    EXPECT_EQ(0, Read(model, 5, kY, HINGE_CODE::Asce17, joint, reason)); // no beams along Y
     model.sections.at(2).bars.clear();
-    EXPECT_EQ(0, Read(model, 5, 0, HINGE_CODE::Asce17, joint, reason));
+    EXPECT_EQ(0, Read(model, 5, kX, HINGE_CODE::Asce17, joint, reason));
     EXPECT_NE(std::string::npos, reason.find("bars"));
     T_JOINT_CHECK check;
     EXPECT_EQ(0, CheckJoint(joint, {std::nan(""), 0.0, 0.0}, check, reason));
+}
+
+// Turned by 30 degrees in plan, columns 0.40 (along the beams) x 0.60 with it.
+TEST(JointCheck, TurnedFramesHaveTheJointsOfStraightOnes)
+{
+    T_MODEL model = Frame();
+    model.sections.at(1).size[1] = 0.6;
+    const double c = std::sqrt(0.75);
+    for (auto& [id, node] : model.nodes)
+        node.xyz = {c * node.xyz[0], 0.5 * node.xyz[0], node.xyz[2]};
+    T_JOINT joint;
+    std::string reason;
+    const std::vector<T_WAY> planes = JointPlanes(model, BeamsByNode(model)[5], 5);
+    ASSERT_EQ(1U, planes.size());
+    EXPECT_NEAR(0.5, planes[0][1], 1e-12);
+    // The columns' local z is X still: their sides are 30 degrees from the beams.
+    EXPECT_EQ(0, Read(model, 5, planes[0], HINGE_CODE::En1998, joint, reason));
+    for (const int column : {1, 2})
+        model.elements.at(column).zAxis = {c, 0.5, 0.0};
+    ASSERT_EQ(1, Read(model, 5, planes[0], HINGE_CODE::En1998, joint, reason)) << reason;
+    EXPECT_EQ(0.4, joint.hc);
+    EXPECT_NEAR(0.5, joint.width, 1e-12); // 0.3 + 0.4/2
+    EXPECT_EQ(JOINT_KIND::Interior, joint.kind);
+}
+
+TEST(JointCheck, WhatIsNoJointOfOneColumnIsRefused)
+{
+    T_JOINT joint;
+    std::string reason;
+    T_MODEL wall = Frame();
+    wall.sections.at(1).size[0] = 2.0;
+    EXPECT_EQ(0, Read(wall, 5, kX, HINGE_CODE::En1998, joint, reason));
+    T_MODEL several = Frame(); // a second member above node 5, to (1, 0, 6)
+    several.nodes.at(9).xyz = {1, 0, 6};
+    several.elements.at(13).nodeI = 5, several.elements.at(13).section = 1;
+    EXPECT_EQ(0, Read(several, 5, kX, HINGE_CODE::En1998, joint, reason));
+    T_MODEL skewed = Frame(); // its beam pushes the joint in the plane of the other, too
+    skewed.nodes.at(6).xyz = {5, 1, 3};
+    EXPECT_EQ(0, Read(skewed, 5, kX, HINGE_CODE::En1998, joint, reason));
+    EXPECT_EQ(2U, JointPlanes(skewed, BeamsByNode(skewed)[5], 5).size());
 }
 
 } // namespace

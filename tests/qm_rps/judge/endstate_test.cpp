@@ -3,6 +3,8 @@
 
 #include <gtest/gtest.h>
 
+#include <cmath>
+
 namespace {
 
 /// A column of 3 m along Z with 0.5 m rigid at its top and a beam of 4 m along X from there with
@@ -77,6 +79,31 @@ TEST(EndState, RotationIsThatOfTheEndLessThatOfTheChord)
     EXPECT_EQ((std::array{-0.006, -120.0}), (std::array{s.flowed, s.hingeMoment}));
     const T_END_STATE y = EndState({9, false, My}, *axes, -1, step.Forces());
     EXPECT_EQ((std::array{0.0, 4.0, 2.0, 0.0}), (std::array{y.N, y.M, y.V, y.flowed}));
+}
+
+// Turned by 30 degrees in plan, column and all: forces in the joint are those of its own plane. At
+// the beam's start M = 4 about its y; the column's head (above the joint: J) has V = 42, N = -40.
+TEST(EndState, JointStateIsThatOfThePlaneOfItsBeams)
+{
+    T_MODEL model = Frame();
+    T_STEP own;
+    own.result.force[0] = own.result.force[1];
+    const double c = std::sqrt(0.75);
+    for (const double along : {1.0, c}) {
+        const double across = std::sqrt(1.0 - along * along);
+        model.nodes[3].xyz = {4 * along, 4 * across, 3};
+        model.elements[9].offset.I = {0.2 * along, 0.2 * across, 0};
+        model.elements[7].zAxis = {along, across, 0};
+        T_JUDGED_JOINT joint;
+        joint.forth = {along, across, 0}, joint.up = {0, 0, 1};
+        joint.beams = {{9, false, *AxesOf(model, model.elements[9])}};
+        joint.above = T_JUDGED_JOINT::T_PART{7, true, *AxesOf(model, model.elements[7])};
+        const T_END_STATE s = JointState(joint, own.Forces());
+        EXPECT_NEAR(4.0, s.M, 1e-12);
+        EXPECT_NEAR(42.0, s.V, 1e-12);
+        EXPECT_NEAR(-40.0, s.N, 1e-12);
+        EXPECT_EQ(along == 1.0 ? "X" : "X+30", PlaneName(joint.forth, 2));
+    }
 }
 
 TEST(EndState, StartLiesOnTheLineThroughTheFirstStepsWhereTheseAreNear)
