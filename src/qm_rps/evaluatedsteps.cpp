@@ -108,18 +108,19 @@ bool MayDrop(const T_RUN_EVENT& event)
     });
 }
 
-/// Displacements at the vertices of a stored push and right behind its start. At a drop of strength
+/// Displacements at the vertices of a stored push. At a drop of strength
 /// the step is the state after it: one right before it is the state that it starts from.
 std::vector<double> PathOf(IPushRun& run, const T_WAY& way)
 {
-    constexpr double kNear = 1e-5, kBefore = 1e-6, kSame = 1e-9; // of the reach
-    std::vector<double> out{way.At(kNear * way.reach), way.At(2.0 * kNear * way.reach)};
+    constexpr double kBefore = 1e-6, kSame = 1e-9; // of the reach
+    std::vector<double> out;
     std::vector<T_RUN_EVENT> events;
     if (!run.ReadEvents(events)) return out;
     const int last = events.empty() ? 0 : events.back().stage;
     const auto add = [&](double d) {
-        const bool isBehind = way.sign * (d - out[1]) > kSame * way.reach;
-        if (isBehind && std::fabs(d - out.back()) > kSame * way.reach) out.push_back(d);
+        const double before = out.empty() ? way.At(0.0) : out.back();
+        const bool isBehind = way.sign * (d - way.At(0.0)) > kSame * way.reach;
+        if (isBehind && std::fabs(d - before) > kSame * way.reach) out.push_back(d);
     };
     for (const T_RUN_EVENT& event : events) {
         if (event.stage != last) continue;

@@ -26,9 +26,9 @@ std::vector<T_HINGES_AT> HingesOfEvaluations(CDBDoc& doc,
 
 /// The same of one evaluation, with the push whose steps the points are (PushAtPoints); the run is
 /// empty where there is no point or a note says why.
-/// `forces`: told of every step of that push, which then also has a step at each vertex of its path
-/// (where strength drops, one 1e-6 of its way before that, too) and two (at 1e-5 and 2e-5 of its
-/// way) behind its start, so that it is straight between them.
+/// `forces`: told of the initial loads, of the start and of every step of that push, which then
+/// also has a step at each vertex of its path (where strength drops, one 1e-6 of its way before
+/// that, too), so that it is straight between them.
 T_HINGES_AT PushToEvaluation(CDBDoc& doc, const T_PUSH_EVALUATION& result,
                              const PUSH_PROGRESS_FN& progress, T_PUSH_RUN& run,
                              const PUSH_FORCES_FN& forces = {});

@@ -54,7 +54,7 @@ const T_LEVELS& NamesOf(const std::vector<T_JUDGED_END>& ends)
     return end == ends.end() ? kLevelNames[0] : end->Levels();
 }
 
-/// Takes the states of all ends from the steps of a push.
+/// Takes the states of all ends from the initial loads, the start and the steps of a push.
 class CPathTaker {
 public:
     CPathTaker(const T_MODEL& model, const T_JUDGE_OPTIONS& options)
@@ -63,20 +63,25 @@ public:
     }
     void Take(const T_STEP_FORCES& step)
     {
-        if (step.step == 0) {
+        const bool isGravity = step.of == FORCES_OF::InitialLoads; // the first that is told
+        if (isGravity) {
             ends = JudgedEnds(m_model, step.run, m_options);
             path = {};
+        } else {
+            path.displacement.push_back(step.run.displacement[step.step]);
+            path.baseReaction.push_back(step.run.baseReaction[step.step]);
         }
-        path.displacement.push_back(step.run.displacement[step.step]);
-        path.baseReaction.push_back(step.run.baseReaction[step.step]);
         std::vector<T_END_STATE> states;
         for (const T_JUDGED_END& end : ends) {
             T_END_STATE& s = states.emplace_back(StateOf(end, step));
             s.largestV = std::fabs(s.V);
-            if (!path.ends.empty())
+            if (!isGravity && !path.ends.empty())
                 s.largestV = std::max(s.largestV, path.ends.back()[states.size() - 1].largestV);
         }
-        path.ends.push_back(std::move(states));
+        if (isGravity)
+            path.gravity = std::move(states);
+        else
+            path.ends.push_back(std::move(states));
     }
 
     std::vector<T_JUDGED_END> ends;
@@ -157,8 +162,8 @@ std::string TargetOf(const std::string& state)
     return std::ranges::find(shares, state) == shares.end() ? state : shares[1];
 }
 
-T_JUDGED_LIMIT LimitOf(const T_FIRST_PASS& first, const T_JUDGED_STATE& state,
-                       const T_JUDGED_PATH& path, double start, CScaledEvaluation& scaled)
+T_JUDGED_LIMIT LimitOf(const T_FIRST_PASS& first, const T_JUDGED_STATE& state, double start,
+                       CScaledEvaluation& scaled)
 {
     T_JUDGED_LIMIT limit;
     limit.first = first;
@@ -174,7 +179,7 @@ T_JUDGED_LIMIT LimitOf(const T_FIRST_PASS& first, const T_JUDGED_STATE& state,
     }
     limit.capacity = std::fabs(first.displacement - start);
     if (first.atStart) {
-        limit.why = Say(path.hasStart ? "IDS_QM_JUDGE_AT_START" : "IDS_QM_JUDGE_AT_FIRST");
+        limit.why = Say("IDS_QM_JUDGE_AT_START");
         return limit;
     }
     limit.factor = scaled.FactorTo(*limit.capacity, target);
@@ -190,7 +195,7 @@ void FindLimits(CDBDoc& doc, const T_PUSH_EVALUATION& result, const T_JUDGED_PAT
     for (const T_JUDGED_STATE& state : out.states)
         for (const T_FIRST_PASS& first : passes)
             if (first.level == state.level)
-                out.limits.push_back(LimitOf(first, state, path, start, scaled));
+                out.limits.push_back(LimitOf(first, state, start, scaled));
 }
 
 /// The state of the path at a displacement that is one of its steps.
@@ -226,10 +231,9 @@ T_JUDGEMENT JudgeEvaluation(CDBDoc& doc, const T_PUSH_EVALUATION& result,
     if (out.note.empty() && hinges.points.empty()) out.note = Say("IDS_QM_JUDGE_NO_POINT");
     if (!out.note.empty()) return out;
     out.ends = std::move(taker.ends);
-    T_JUDGED_PATH path = std::move(taker.path);
+    const T_JUDGED_PATH path = std::move(taker.path);
     out.start = run.startDisplacement;
     out.stale = StaleHinges(doc);
-    PutStart(run.startDisplacement, path);
     out.states = StatesOf(hinges, options, NamesOf(out.ends));
     for (T_JUDGED_STATE& state : out.states)
         if (state.found == AT_POINT::Reached)

@@ -31,7 +31,8 @@ public:
 
     const T_PUSH_COST& Cost() const;
 
-    /// Forces of all elements in a step of the last run, by the model's indices.
+    /// Forces of all elements in a step of the last run, the starts of its stages included, by the
+    /// model's indices.
     [[nodiscard]] int Forces(const T_PUSH_STEP& step, T_RESULT& out, T_SOLVER_ERROR& error);
 
 private:

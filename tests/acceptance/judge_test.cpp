@@ -196,6 +196,8 @@ TEST_F(Judge, JointByHand)
         {"EN1998-3", true, 1.0, 601.7127514426132, [](double Vj) { return Vj; }},
         {"Circolare2019", false, 1.0, 1183.2159566199232, principal},
         {"ASCE41-17", false, 1.3, 320.8397961700119, [](double Vj) { return Vj; }},
+        // The initial loads have moved the control node against this push.
+        {"ASCE41-17", true, 1.3, 320.8397961700119, [](double Vj) { return Vj; }},
     };
     for (const auto& c : kCases) {
         json file = WithJoint();
@@ -228,9 +230,9 @@ TEST_F(Judge, JointByHand)
     }
 }
 
-// N / Npl = 0.21: chord rotation against 2, 7, 9 theta_y and N against buckling. 0.337: no rotation
-// is counted on; M / MN,y is above N / Nb. ASCE 41 without hinges has no rotation, and factors on
-// forces; N is that of gravity throughout.
+// N / Npl = 0.21: chord rotation against 2, 7, 9 theta_y and N against buckling. 0.337: no plastic
+// rotation is counted on, there is none; M / MN,y and 6.3.3 (lambda_y 0.387). ASCE 41 without
+// hinges has no rotation, and factors on forces; N is that of gravity throughout.
 TEST_F(Judge, SteelByHand)
 {
     Write("a.json", OfSteel(400.0).dump(1));
@@ -247,9 +249,11 @@ TEST_F(Judge, SteelByHand)
         EXPECT_NEAR(V / 223.04484274468217, foot.at("shear").at("ratio"), 1e-6);
         EXPECT_NEAR(400.0 / buckled, foot.at("axial_force").at("ratio"), 1e-6);
         const json& pressed = EndOf(presses.at(i), "I");
-        EXPECT_FALSE(pressed.contains("rotation"));
+        EXPECT_EQ(0.0, pressed.at("rotation").at("demand"));
         const double M = std::fabs(pressed.at("M").get<double>());
-        EXPECT_NEAR(std::max(M / 115.60281347006655, 640.0 / buckled),
+        const double part = 0.9608260822323937 * M / 156.55631250; // kyy My / Mpl
+        EXPECT_NEAR(std::max({M / 115.60281347006655, 0.3614727724340312 + part,
+                              640.0 / buckled + 0.6 * part}),
                     pressed.at("axial_force").at("ratio"), 1e-6);
     }
     Write("d.json", OfSteel(2000.0).dump(1)); // beyond Npl

@@ -54,12 +54,13 @@ struct T_MEMBER_END {
     bool aboutY = true;
     T_SECT_D section; // with its properties
     T_MATL_D material;
-    double clear = 0.0; // length between the offsets
-    double axial = 0.0; // compression positive
-    double EI = 0.0;    // of the model: up to yield it bends with 6 EI / clear
-    double EA = 0.0;    // of the model
-    double GA = 0.0;    // of the model, across the axis of bending; 0: no shear deformation
-    double tie = 0.0;   // of spandrels: strength of what ties the wall there; 0: nothing
+    double clear = 0.0;              // length between the offsets
+    double axial = 0.0;              // compression positive
+    std::optional<double> gravity{}; // of that, what Eq. (10-3) of ASCE 41 counts; empty: all
+    double EI = 0.0;                 // of the model: up to yield it bends with 6 EI / clear
+    double EA = 0.0;                 // of the model
+    double GA = 0.0;  // of the model, across the axis of bending; 0: no shear deformation
+    double tie = 0.0; // of spandrels: strength of what ties the wall there; 0: nothing
     std::optional<T_PUSHED_SHEAR> pushed{}; // else V of both ends' strengths, shear span clear / 2
 
     std::optional<T_STEEL_CONNECTION> connection{};

@@ -114,7 +114,7 @@ std::optional<T_ASCE_COLUMN_STRENGTH> AsceColumnShearOf(const T_RC_BASIS& in,
     shear.fc = material.fc;
     shear.d = s.d;
     shear.Ag = s.area;
-    shear.axial = in.axial;
+    shear.axial = in.end.HasAxial() ? in.end.gravity.value_or(in.axial) : in.axial;
     shear.momentShear = in.end.ShearSpan();
     shear.ductility = ductility;
     return AsceColumnShear(shear, sheet);

@@ -100,26 +100,6 @@ T_END_STATE EndState(const T_END_PLACE& place, const T_MEMBER_AXES& axes, long h
     return s;
 }
 
-void PutStart(double displacement, T_JUDGED_PATH& path)
-{
-    constexpr double kNear = 2.1e-5; // of the way: no vertex is looked for there
-    if (path.ends.size() < 2) return;
-    const double first = path.displacement[0], second = path.displacement[1];
-    const double way = std::fabs(path.displacement.back() - displacement);
-    if (first == displacement || second == first || std::fabs(second - displacement) > kNear * way)
-        return;
-    const double at = (displacement - first) / (second - first); // below 0
-    std::vector<T_END_STATE> start;
-    for (std::size_t e = 0; e < path.ends[0].size(); ++e)
-        start.push_back(Between(path.ends[0][e], path.ends[1][e], at));
-    path.baseReaction.insert(path.baseReaction.begin(),
-                             path.baseReaction[0] +
-                                 at * (path.baseReaction[1] - path.baseReaction[0]));
-    path.displacement.insert(path.displacement.begin(), displacement);
-    path.ends.insert(path.ends.begin(), std::move(start));
-    path.hasStart = true;
-}
-
 std::size_t LargestShearAt(const T_JUDGED_PATH& path)
 {
     constexpr double kSame = 1e-9; // of the largest: a level branch has its first state

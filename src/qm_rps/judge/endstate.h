@@ -31,16 +31,13 @@ T_END_STATE Between(const T_END_STATE& a, const T_END_STATE& b, double at);
 T_END_STATE EndState(const T_END_PLACE& place, const T_MEMBER_AXES& axes, long hinge,
                      const T_STEP_FORCES& step);
 
-/// A path of states: straight from each to the next one. Index 0 is the state before the first
-/// step, where it is known.
+/// A path of states: straight from each to the next one. Index 0 is the state that the push starts
+/// from.
 struct T_JUDGED_PATH {
-    bool hasStart = false;
+    std::vector<T_END_STATE> gravity; // by end, under the initial loads alone; empty: not known
     std::vector<double> displacement, baseReaction; // of the control, totals
     std::vector<std::vector<T_END_STATE>> ends;     // by state and end
 };
-/// Puts what stood before the first step in front: on the line through the first two states, where
-/// these are steps right behind the start (PushToEvaluation); else the path stays without a start.
-void PutStart(double displacement, T_JUDGED_PATH& path);
 /// Index of the first state with the largest base reaction, by its magnitude in the direction of
 /// the push.
 std::size_t LargestShearAt(const T_JUDGED_PATH& path);

@@ -108,7 +108,8 @@ void ChordShear(const T_CHECKING& c)
 std::optional<double> ForceStrength(const T_CHECKING& c, CCodeSheet& sheet)
 {
     const T_END_STATE& s = c.with.brittle;
-    const T_MEMBER_END member = ShearEnd(c.end, s, sheet);
+    T_MEMBER_END member = ShearEnd(c.end, s, sheet);
+    member.gravity = c.with.gravity->N;
     const T_MATL_D& m = member.material;
     const std::optional<T_RC_BASIS> basis = RcBasis(member, IsPositiveSide(c.end, s), sheet);
     if (!basis || !sheet.Positive({{"fck", m.fck}, {"fyk", m.fyk}})) return {};

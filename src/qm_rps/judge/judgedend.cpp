@@ -205,6 +205,7 @@ void PlasticRotations(const T_CHECKING& c, double axial)
     CCodeSheet span, sheet;
     T_MEMBER_END member = ShearEnd(c.end, c.state, span);
     member.axial = axial;
+    if (c.with.gravity) member.gravity = c.with.gravity->N;
     // The rows of tables take the V that the member was designed to have: it does not fall again
     // with the strength of its hinges.
     const double V = std::max(c.state.largestV, std::fabs(c.state.V));

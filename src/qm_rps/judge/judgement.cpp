@@ -64,7 +64,7 @@ T_STATE_CONTEXT ContextOf(const T_JUDGED_PATH& path, std::size_t end, const T_EN
 {
     T_STATE_CONTEXT with;
     with.brittle = brittle;
-    if (path.hasStart) with.gravity = path.ends.front()[end];
+    if (!path.gravity.empty()) with.gravity = path.gravity[end];
     with.factors = factors;
     return with;
 }

@@ -145,7 +145,7 @@ int CPushRun::RunCase(T_PREPARED& on, const T_PUSH_CASE& c, const PUSH_PROGRESS_
                       T_PUSH_RUN& out, std::string& error)
 {
     CPushCollector collector(m_model, m_frame, on.hinges, c);
-    std::vector<solver::T_PUSH_STEP> steps; // of the case, where their forces are told
+    std::vector<solver::T_PUSH_STEP> steps, starts; // where their forces are told
     solver::T_PUSH_SINK sink;
     sink.step = [&](const solver::T_PUSH_STEP& step) {
         if (!collector.Take(step)) return true;
@@ -155,7 +155,10 @@ int CPushRun::RunCase(T_PREPARED& on, const T_PUSH_CASE& c, const PUSH_PROGRESS_
                                       so.displacement.back(), so.baseReaction.back(),
                                       so.startDisplacement, so.startReaction.value_or(0.0)});
     };
-    sink.start = [&](const solver::T_PUSH_STEP& step) { collector.Start(step); };
+    sink.start = [&](const solver::T_PUSH_STEP& step) {
+        collector.Start(step);
+        if (m_forces) starts.push_back(step);
+    };
     sink.event = [&](const solver::T_PUSH_EVENT& event) { collector.Take(event); };
     solver::T_PUSH_END end;
     solver::T_SOLVER_ERROR fault;
@@ -164,7 +167,34 @@ int CPushRun::RunCase(T_PREPARED& on, const T_PUSH_CASE& c, const PUSH_PROGRESS_
         return 0;
     }
     out = collector.Finish(end);
-    return TellSteps(on, out, steps, error);
+    return TellStarts(on, c, starts, error) && TellSteps(on, out, steps, error) ? 1 : 0;
+}
+
+/// The first stage starts under the initial loads, the last one is that of the case.
+int CPushRun::TellStarts(T_PREPARED& on, const T_PUSH_CASE& c,
+                         const std::vector<solver::T_PUSH_STEP>& starts, std::string& error)
+{
+    const std::size_t own = c.stages.size() - 1;
+    const auto tell = [&](const solver::T_PUSH_STEP& start, FORCES_OF of) {
+        solver::T_RESULT result;
+        solver::T_SOLVER_ERROR fault;
+        if (!on.solver.Forces(start, result, fault)) {
+            error = Words(fault);
+            return false;
+        }
+        solver::T_PUSH_STEP step = start;
+        step.stage = own;
+        CPushCollector alone(m_model, m_frame, on.hinges, c);
+        (void)alone.Take(step);
+        const T_PUSH_RUN run = alone.Finish({});
+        m_forces({run, 0, m_frame.ElementIds(), result, of});
+        return true;
+    };
+    for (const solver::T_PUSH_STEP& start : starts) {
+        if (start.stage == 0 && !tell(start, FORCES_OF::InitialLoads)) return 0;
+        if (start.stage == own && !tell(start, FORCES_OF::Start)) return 0;
+    }
+    return 1;
 }
 
 int CPushRun::TellSteps(T_PREPARED& on, const T_PUSH_RUN& run,

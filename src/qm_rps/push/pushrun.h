@@ -61,12 +61,19 @@ struct T_PUSH_PROGRESS {
     double displacement = 0.0, baseReaction = 0.0;
     double startDisplacement = 0.0, startReaction = 0.0; // before the first step
 };
+/// What member forces are those of.
+enum class FORCES_OF {
+    Step,
+    InitialLoads, // alone, before any push
+    Start,        // of the load case, behind those that it starts from
+};
 /// The member forces of a step, told once its load case has been pushed.
 struct T_STEP_FORCES {
     const T_PUSH_RUN& run;
     std::size_t step = 0;             // index of the run's steps
     const std::vector<int>& elements; // ids by the index of `result`
     const solver::T_RESULT& result;
+    FORCES_OF of = FORCES_OF::Step; // else `run` has that state as its only step
 };
 using PUSH_FORCES_FN = std::function<void(const T_STEP_FORCES&)>;
 
@@ -89,7 +96,8 @@ public:
     [[nodiscard]] int Run(int key, const PUSH_PROGRESS_FN& progress, std::vector<T_PUSH_RUN>& out,
                           std::string& error, const std::vector<double>& extra = {});
 
-    /// Runs from now on tell the member forces of their steps, in order, step after step.
+    /// Runs from now on tell the member forces under the initial loads, at their start, and of
+    /// their steps, in order.
     void TellForces(PUSH_FORCES_FN tell) { m_forces = std::move(tell); }
 
     /// The results of a load case that the document has, as Run gives them: states and storey
@@ -117,6 +125,8 @@ private:
                                           std::string& error);
     int RunCase(T_PREPARED& on, const T_PUSH_CASE& c, const PUSH_PROGRESS_FN& progress,
                 T_PUSH_RUN& out, std::string& error);
+    int TellStarts(T_PREPARED& on, const T_PUSH_CASE& c,
+                   const std::vector<solver::T_PUSH_STEP>& starts, std::string& error);
     int TellSteps(T_PREPARED& on, const T_PUSH_RUN& run,
                   const std::vector<solver::T_PUSH_STEP>& steps, std::string& error);
     std::string Words(const solver::T_SOLVER_ERROR& error) const;

@@ -178,8 +178,12 @@ CPushRun::T_FAULT CPushRun::GiveStart(std::size_t number)
     const T_PUSH_STATE state = m_path->State();
     T_PUSH_STEP step;
     step.stage = number;
+    step.loadFactor = m_path->Factor();
+    step.displacement = m_path->Watched(m_controlWatch);
+    step.hinges = m_path->HingeStates();
     std::vector<double> tension;
     if (auto fault = m_structure.Displace({&state, 1}, {&step, 1}, tension)) return fault;
+    m_kept.push_back({number, step.loadFactor, step.displacement, state});
     m_sink.start(step);
     return {};
 }

@@ -105,26 +105,3 @@ TEST(EndState, JointStateIsThatOfThePlaneOfItsBeams)
         EXPECT_EQ(along == 1.0 ? "X" : "X+30", PlaneName(joint.forth, 2));
     }
 }
-
-TEST(EndState, StartLiesOnTheLineThroughTheFirstStepsWhereTheseAreNear)
-{
-    const auto at = [](double V) {
-        T_END_STATE s;
-        s.V = V;
-        return std::vector{s};
-    };
-    T_JUDGED_PATH path;
-    path.displacement = {0.011, 0.012, 100.01};
-    path.baseReaction = {5.0, 10.0, 500.0};
-    path.ends = {at(-7.0), at(-4.0), at(80.0)};
-    T_JUDGED_PATH far = path;
-    PutStart(0.01, path);
-    ASSERT_TRUE(path.hasStart);
-    EXPECT_NEAR(-10.0, path.ends[0][0].V, 1e-9); // gravity
-    EXPECT_NEAR(0.0, path.baseReaction[0], 1e-9);
-    EXPECT_EQ(0.01, path.displacement[0]);
-    far.displacement = {0.5, 1.0, 100.01}; // plain steps: a vertex may lie between
-    PutStart(0.01, far);
-    EXPECT_FALSE(far.hasStart);
-    EXPECT_EQ(3U, far.ends.size());
-}

@@ -72,6 +72,7 @@ T_END_CHECKS Checked(const T_JUDGED_END& end, const T_END_STATE& s, double gravi
     with.brittle = s;
     with.gravity = T_END_STATE{};
     with.gravity->V = gravity;
+    with.gravity->N = 640.0 * kN; // N_UG
     return CheckEnd(end, s, with);
 }
 
@@ -122,6 +123,9 @@ TEST(Judgement, AsceTakesForcesWithTheirFactorsAndLowerBounds)
     EXPECT_NEAR(75.0 * kN, checks.At(kShear, 2)->demand, 1e-6);
     const double knl = 1.0 - 0.3 * (std::clamp(1.0 + 0.02 / checks.thetaY, 2.0, 6.0) - 2.0) / 4.0;
     EXPECT_NEAR(0.9 * knl * 214.12764372719835 * kN, checks.At(kShear, 2)->capacity, 0.1);
+    T_END_STATE pressed = State(0.0, 60.0 * kN); // Eq. (10-3) counts N of the gravity loads alone
+    pressed.N = 900.0 * kN;
+    EXPECT_NEAR(0.9 * 214.12764372719835 * kN, Checked(end, pressed).At(kShear, 2)->capacity, 0.1);
     EXPECT_NEAR(0.02, checks.At(kRotation, 1)->demand, 1e-12);
     T_STATE_CONTEXT unknown; // a push without steps behind its start
     unknown.brittle = State(0.02, 60.0 * kN);
@@ -204,7 +208,7 @@ TEST(Judgement, CircolareReadsShearAtThePeakWhereThatComesBefore)
     path.baseReaction = {50.0, 80.0, 100.0, 60.0};
     for (const double V : {30.0, 45.0, 55.0, 35.0})
         path.ends.push_back({State(0.02, V * kN), State(0.02, V * kN)});
-    path.hasStart = true;
+    path.gravity = path.ends.front();
     const struct {
         std::size_t index;
         double circolare, en;
