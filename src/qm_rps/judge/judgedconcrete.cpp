@@ -165,7 +165,8 @@ void CheckConcrete(const T_CHECKING& c)
     else
         PlasticRotations(c, c.state.N);
     const std::string& why = c.Of(JUDGE_MODE::Rotation).why;
-    if (!why.empty())
+    const bool needsRotation = chord || c.end.member.kind == MEMBER_KIND::Column;
+    if (!why.empty() && needsRotation)
         c.Of(JUDGE_MODE::Shear).why = why; // the ductility of its strength is not known
     else if (chord)
         ChordShear(c);

@@ -212,6 +212,10 @@ void PlasticRotations(const T_CHECKING& c, double axial)
     if (V > 0.0) member.pushed = {V, member.ShearSpan()};
     const auto side = GeneratedSide(member, IsPositiveSide(c.end, c.state), check.why);
     if (!side) return;
+    if (c.end.hinge < 0) { // plastic rotations are those of a hinge
+        check.why = Say("IDS_QM_JUDGE_NO_HINGE");
+        return;
+    }
     check.trace = side->trace;
     check.trace.insert(check.trace.end(), span.Trace().begin(), span.Trace().end());
     c.out.warnings = side->warnings;

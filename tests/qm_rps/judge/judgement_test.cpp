@@ -26,6 +26,7 @@ T_JUDGED_END Column(HINGE_CODE code)
 {
     T_JUDGED_END end;
     end.basis = JUDGE_BASIS::Code;
+    end.hinge = 0;
     end.axes.length = 3.0;
     T_MEMBER_END& m = end.member;
     m.code = code;

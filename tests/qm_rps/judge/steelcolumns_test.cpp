@@ -1,5 +1,5 @@
 // Columns of steel under more axial force than their code counts on rotations with, by hand.
-#include "qm_rps/judge/judgedend.h"
+#include "qm_rps/judge/judgement.h"
 
 #include <gtest/gtest.h>
 
@@ -42,6 +42,8 @@ T_END_CHECKS Checked(const T_JUDGED_END& end, double N, double M, double flowed)
     s.N = N, s.M = M, s.V = M / 2.0, s.flowed = flowed;
     T_STATE_CONTEXT with;
     with.brittle = s;
+    with.gravity = T_END_STATE{};
+    with.gravity->N = N;
     return CheckEnd(end, s, with);
 }
 
@@ -100,4 +102,57 @@ TEST(SteelColumns, ClassAndBucklingCountBeyondTheAxialForceOfTheCode)
         Checked(Column(0.3, 0.3, 0.005, 0.008, 275e6, 3.0), 700.0 * kN, 10.0 * kN, 0.0);
     EXPECT_FALSE(slender.At(kAxial, 1));
     EXPECT_NE(std::string::npos, slender.Of(kAxial)->why.find("class 4"));
+}
+
+// 0.2 x 0.2, Fye 303, N = 1500: P/Pye = 0.66, force-controlled, and left out when hinges were
+// generated. kappa 0.9: Pr/Pc + 8/9 1.69 M/(0.9 Zy 275), Pc by AISC 360 E3 with Fy; shear 1.69 V
+// against 0.9 0.6 275 0.2 0.009. Under N = 400 rotations count: without a hinge they are not known.
+TEST(SteelColumns, WithoutAHingeForcesAreJudgedAllTheSame)
+{
+    T_JUDGED_END end = Column(0.2, 0.2, 0.009, 0.015, 275e6, 3.0);
+    end.member.code = HINGE_CODE::Asce17;
+    end.member.material.mean->fy = 303e6;
+    end.member.material.knowledge = MATL_KNOWLEDGE::KL2;
+    const T_SECT_D& s = end.member.section;
+    const double Fe = std::acos(-1.0) * std::acos(-1.0) * 210e9 * s.Izz / s.area / 9.0;
+    const double Pc = 0.9 * std::pow(0.658, 275e6 / Fe) * 275e6 * s.area;
+    const T_END_CHECKS checks = Checked(end, 1500.0 * kN, 20.0 * kN, 0.0);
+    EXPECT_NEAR(1500e3 / Pc + 8.0 / 9.0 * 1.69 * 20e3 / (0.9 * s.Zy * 275e6),
+                *checks.At(kAxial, 1)->Ratio(), 1e-9);
+    EXPECT_NEAR(1.69 * 10.0 / 267.3, *checks.At(JUDGE_MODE::Shear, 1)->Ratio(), 1e-9);
+    EXPECT_TRUE(checks.At(kRotation, 1)->Holds());
+    const T_END_CHECKS low = Checked(end, 400.0 * kN, 20.0 * kN, 0.0);
+    EXPECT_FALSE(low.At(kRotation, 1));
+    EXPECT_NEAR(400e3 / Pc, *low.At(kAxial, 1)->Ratio(), 1e-9);
+}
+
+TEST(SteelColumns, MembersWithoutHingesHaveTheOneCodeOfTheModel)
+{
+    T_MODEL model;
+    for (const int i : {0, 1, 2})
+        model.nodes[i + 1].xyz = {0, 0, 3.0 * i};
+    const T_JUDGED_END column = Column(0.2, 0.2, 0.009, 0.015, 275e6, 3.0);
+    model.sections[1] = column.member.section;
+    model.materials[1] = column.member.material;
+    for (const int id : {1, 2}) {
+        T_ELEM_D& e = model.elements[id];
+        e.id = id, e.nodeI = id, e.nodeJ = id + 1, e.section = e.material = 1;
+        T_PHGT_D type;
+        type.generated.emplace();
+        type.generated->code = "ASCE41-13";
+        model.hingeTypes[id] = type;
+    }
+    model.hinges[1].element = 1, model.hinges[1].hingeType = 1;
+    const auto codeOfSecond = [&] {
+        std::string code;
+        for (const T_JUDGED_END& end : JudgedEnds(model, {}, {}))
+            if (end.place.element == 2) code = end.Code();
+        return code;
+    };
+    EXPECT_EQ("ASCE41-13", codeOfSecond());
+    model.elements[3] = model.elements[2]; // of another code: neither is the model's
+    model.elements[3].id = 3;
+    model.hingeTypes[2].generated->code = "EN1998-3";
+    model.hinges[2].element = 3, model.hinges[2].hingeType = 2;
+    EXPECT_EQ("", codeOfSecond());
 }
