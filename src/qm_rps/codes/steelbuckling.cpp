@@ -1,5 +1,7 @@
 #include "qm_rps/codes/steelbuckling.h"
 
+#include "qm_rps/codes/slenderplates.h"
+
 #include <algorithm>
 #include <array>
 #include <cmath>
@@ -119,7 +121,8 @@ std::optional<double> EnBeamColumn(const T_EN_BEAM_COLUMN& c, const T_STEEL_FORC
     return std::max(first, second);
 }
 
-std::optional<double> AiscBuckling(const T_BUCKLING& b, CCodeSheet& sheet)
+std::optional<double> AiscBuckling(const T_BUCKLING& b, const T_STEEL_SHAPE& shape,
+                                   CCodeSheet& sheet)
 {
     if (!Sound(b, sheet)) return {};
     const double slender = sheet.Put("K L/r", b.length / b.radius, kAisc, "", K);
@@ -129,5 +132,8 @@ std::optional<double> AiscBuckling(const T_BUCKLING& b, CCodeSheet& sheet)
     const double stress =
         sheet.Put("Fcr", ratio <= 2.25 ? std::pow(0.658, ratio) * b.fy : 0.877 * euler, kDimStress,
                   kAisc, "0.658^(Fy/Fe) Fy, Fy/Fe <= 2.25; 0.877 Fe", R);
-    return sheet.Put("Pn", stress * b.area, kDimForce, kAisc, "Fcr A", R);
+    const auto area = AiscCompressedArea(shape, stress, b.fy, b.E, sheet);
+    if (!area) return {};
+    return sheet.Put("Pn", stress * *area, kDimForce, kAisc, *area < b.area ? "Fcr Ae" : "Fcr A",
+                     R);
 }

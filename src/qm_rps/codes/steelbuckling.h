@@ -22,8 +22,9 @@ struct T_EN_BUCKLED {
 std::optional<T_EN_BUCKLED> EnBuckled(const T_BUCKLING& b, double imperfection, CCodeSheet& sheet);
 /// Its strength.
 std::optional<double> EnBuckling(const T_BUCKLING& b, double imperfection, CCodeSheet& sheet);
-/// AISC 360 E3: Fcr A, members without slender plates.
-std::optional<double> AiscBuckling(const T_BUCKLING& b, CCodeSheet& sheet);
+/// AISC 360 E3, E7: Fcr Ae of a member of this shape.
+std::optional<double> AiscBuckling(const T_BUCKLING& b, const T_STEEL_SHAPE& shape,
+                                   CCodeSheet& sheet);
 
 /// A compressed and bent member of class 1 to 3.
 struct T_EN_BEAM_COLUMN {

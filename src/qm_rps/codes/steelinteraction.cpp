@@ -220,6 +220,12 @@ std::optional<double> AiscShapeShear(const T_STEEL_SHAPE& s, bool alongDepth, do
                      R);
 }
 
+T_AISC_SLENDER AiscSlender(STEEL_SHAPE shape)
+{
+    const auto row = std::ranges::find(kSlender, shape, &T_SLENDER_ROW::shape);
+    return {row->slenderFlange, row->slenderWeb};
+}
+
 bool AiscPlastic(const T_STEEL_SHAPE& s, double Fy, double E, bool compressed, bool bent,
                  CCodeSheet& sheet)
 {

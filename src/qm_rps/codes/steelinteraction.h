@@ -55,6 +55,12 @@ std::optional<double> AiscShear(double d, double h, double tw, double Fy, double
 std::optional<double> AiscShapeShear(const T_STEEL_SHAPE& s, bool alongDepth, double Fy, double E,
                                      CCodeSheet& sheet);
 
+/// AISC 360 Table B4.1: limits of plates in uniform compression, over sqrt(E/Fy); of circular tubes
+/// over E/Fy.
+struct T_AISC_SLENDER {
+    double flange = 0.0, web = 0.0;
+};
+T_AISC_SLENDER AiscSlender(STEEL_SHAPE shape);
 /// AISC 360 Table B4.1: the section reaches A Fy (`compressed`: no slender plate) and Z Fy (`bent`:
 /// all are compact). False: the sheet says which plate is too slender.
 bool AiscPlastic(const T_STEEL_SHAPE& s, double Fy, double E, bool compressed, bool bent,

@@ -36,17 +36,6 @@ T_BUCKLING BucklingOf(const T_STEEL_BASIS& in, double fy)
 
 // ---- bending ------------------------------------------------------------------------------------
 
-/// Strength of the plates along the shear force.
-std::optional<double> ShearStrength(const T_STEEL_BASIS& in, CCodeSheet& sheet)
-{
-    const T_STEEL_SHAPE& s = in.shape;
-    if (IsChordCode(in.end.code)) {
-        const auto area = EnShearArea(s, in.end.aboutY, sheet);
-        return area ? EnPlasticShear(*area, in.fy, sheet) : std::nullopt;
-    }
-    return AiscShapeShear(s, in.end.aboutY, in.fy, in.E, sheet);
-}
-
 /// a, b, c of the connection with the factors of the joint; it has no acceptance values.
 std::optional<T_CODE_PLASTIC> ConnectionOf(const T_STEEL_BASIS& in, CCodeSheet& sheet)
 {
@@ -85,7 +74,7 @@ std::optional<T_STEEL_PLASTIC> ColumnRow(const T_STEEL_BASIS& in, CCodeSheet& sh
     T_STEEL_MEMBER m = in.Member();
     if (in.end.code == HINGE_CODE::Aisc342) return Aisc342Column(m, sheet);
     if (in.end.code != HINGE_CODE::Asce17) {
-        const auto strength = AiscBuckling(BucklingOf(in, in.lower), sheet);
+        const auto strength = AiscBuckling(BucklingOf(in, in.lower), in.shape, sheet);
         if (!strength) return {};
         m.axialStrength =
             sheet.Put("P_CL", *strength, kDimForce, "ASCE 41-13 9.4.2.3.2", "Pn with Fy", R);
@@ -152,7 +141,7 @@ std::optional<T_CODE_BACKBONE> EnBending(const T_STEEL_BASIS& in, T_CODE_SIDE& s
 /// Shear beside the strength of bending, on the sheet.
 bool JudgeShear(const T_STEEL_BASIS& in, T_CODE_SIDE& side, CCodeSheet& sheet)
 {
-    const std::optional<double> strength = ShearStrength(in, sheet);
+    const std::optional<double> strength = SteelShear(in, in.fy, sheet);
     if (!strength) return false;
     side.shear = ShearOf(in.end, 2.0 * side.strength / in.end.clear, sheet);
     side.shearStrength = *strength;
@@ -196,7 +185,7 @@ std::optional<double> BuckledStrength(const T_STEEL_BASIS& in, CCodeSheet& sheet
 {
     const T_BUCKLING b = BucklingOf(in, in.fy);
     sheet.Put("K L", b.length, kDimLength, "", "clear length, K = 1", K);
-    if (!IsChordCode(in.end.code)) return AiscBuckling(b, sheet);
+    if (!IsChordCode(in.end.code)) return AiscBuckling(b, in.shape, sheet);
     return EnBuckling(b, EnImperfection(in.shape, in.iz <= in.iy, sheet), sheet);
 }
 

@@ -1,6 +1,7 @@
 #include "qm_rps/generate/steelmember.h"
 
 #include "qm_rps/codes/asce41strength.h"
+#include "qm_rps/codes/slenderplates.h"
 #include "qm_rps/generate/rcmember.h"
 
 #include <cmath>
@@ -122,4 +123,10 @@ std::optional<double> SteelMoment(const T_STEEL_BASIS& in, double axial, CCodeSh
     const auto reduced = EnAxialBending(in.shape, in.strength, {axial, 0.0, 0.0}, sheet);
     if (!reduced) return {};
     return in.end.aboutY ? reduced->MNy : reduced->MNz;
+}
+
+std::optional<double> SteelShear(const T_STEEL_BASIS& in, double fy, CCodeSheet& sheet)
+{
+    if (IsChordCode(in.end.code)) return EnShearStrength(in.shape, in.end.aboutY, fy, sheet);
+    return AiscShapeShear(in.shape, in.end.aboutY, fy, in.E, sheet);
 }

@@ -34,6 +34,9 @@ ASCE_EDITION SteelEdition(const T_MEMBER_END& end);
 
 /// Plastic moment with an axial force of either sign: ASCE 41, or EN 1993-1-1 6.2.9.
 std::optional<double> SteelMoment(const T_STEEL_BASIS& in, double axial, CCodeSheet& sheet);
+/// Shear strength across the axis of bending with a yield strength: EN 1993-1-1 6.2.6 with EN
+/// 1993-1-5 5, or AISC 360 G.
+std::optional<double> SteelShear(const T_STEEL_BASIS& in, double fy, CCodeSheet& sheet);
 
 /// Under a moment about y the section may buckle sideways: an I, a flat bar and what is given by
 /// values; round and hollow sections do not (EN 1993-1-1 6.3.2.1(2)).

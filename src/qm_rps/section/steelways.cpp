@@ -1,6 +1,7 @@
 // How steel sections are checked beside the section calculator.
 #include "qm_db/sectionproperties.h"
 #include "qm_rps/codes/en1993class.h"
+#include "qm_rps/codes/slenderplates.h"
 #include "qm_rps/generate/steelmember.h"
 #include "qm_rps/section/sectionways.h"
 
@@ -68,11 +69,12 @@ std::optional<double> Lost(const T_STEEL_CHECK& c, double shear, bool alongDepth
                            CCodeSheet& sheet)
 {
     if (shear == 0.0) return 0.0;
-    const auto found = EnShearArea(c.shape, alongDepth, sheet);
-    const auto plastic = found ? EnPlasticShear(*found, c.fy, sheet) : std::nullopt;
-    if (!plastic) return {};
+    CCodeSheet told; // with the strength
+    const auto found = EnShearArea(c.shape, alongDepth, told);
+    const auto strength = EnShearStrength(c.shape, alongDepth, c.fy, sheet);
+    if (!strength || !found) return {};
     area = *found;
-    return EnShearReduction(shear, *plastic, sheet);
+    return EnShearReduction(shear, *strength, sheet);
 }
 
 /// The strengths that shear leaves. Of an I under a force along its web by Eq. (6.30); others lose
@@ -121,10 +123,11 @@ std::optional<double> EnShearAlong(const T_CHECK_JOB& job, double shear, bool al
                                    CCodeSheet& sheet)
 {
     const auto shape = SteelShapeOf(job.section, sheet);
-    const auto area = shape ? EnShearArea(*shape, alongDepth, sheet) : std::nullopt;
-    const auto strength = area ? EnPlasticShear(*area, job.strengths.fy, sheet) : std::nullopt;
+    const auto strength =
+        shape ? EnShearStrength(*shape, alongDepth, job.strengths.fy, sheet) : std::nullopt;
     if (!strength) return {};
-    return sheet.Put("ratio", std::fabs(shear) / *strength, "EN 1993-1-1 6.2.6", "V/Vpl", R);
+    return sheet.Put("ratio", std::fabs(shear) / *strength, "EN 1993-1-1 6.2.6",
+                     "V/Vpl, slender webs V/Vbw", R);
 }
 
 std::optional<double> EnShearZ(const T_CHECK_JOB& job, const T_SECTION_FORCES& f, CCodeSheet& sheet,
