@@ -3,8 +3,38 @@
 #include "registrations.h"
 #include "reportcommand.h"
 
+#ifdef QM_UI
+#include "report/modelreportcommand.h"
+
+namespace {
+
+void AddModelReport(CLI::App& app, EXIT_CODE& code)
+{
+    auto* sub = app.add_subcommand("report", Say("IDS_QM_HELP_REPORT"));
+    auto o = std::make_shared<T_MODEL_REPORT_OPTIONS>();
+    AddFile(sub, o->file);
+    sub->add_option("--html", o->html, Say("IDS_QM_HELP_REPORT_HTML"));
+    sub->add_option("--pdf", o->pdf, Say("IDS_QM_HELP_REPORT_PDF"));
+    sub->add_option("--only", o->only, Say("IDS_QM_HELP_REPORT_ONLY"));
+    sub->add_option("--rows", o->rows, Say("IDS_QM_HELP_REPORT_ROWS"))->capture_default_str();
+    sub->add_option("--project", o->head.project, Say("IDS_QM_HELP_REPORT_PROJECT"));
+    sub->add_option("--author", o->head.author, Say("IDS_QM_HELP_REPORT_AUTHOR"));
+    sub->add_option("--checker", o->head.checker, Say("IDS_QM_HELP_REPORT_CHECKER"));
+    sub->add_option("--date", o->head.date, Say("IDS_QM_HELP_REPORT_DATE"));
+    AddOverwrite(sub, o->overwrite);
+    AddExample(sub, "report examples/rc-frame-3-storey/case.json --html report.html --pdf "
+                    "report.pdf --author \"A. Engineer\" --date 2026-11-23");
+    sub->callback([o, &code] { code = RunModelReport(*o); });
+}
+
+} // namespace
+#endif
+
 void AddReport(CLI::App& app, EXIT_CODE& code)
 {
+#ifdef QM_UI
+    AddModelReport(app, code);
+#endif
     auto* sub = app.add_subcommand("report-data", Say("IDS_QM_HELP_REPORT_DATA"));
     auto in = std::make_shared<std::string>(), out = std::make_shared<std::string>("-");
     AddFile(sub, *in);

@@ -15,6 +15,8 @@ enum class OUTPUT_KIND {
     Document, // .qmdb, or a case file, .json
     Sheet,    // .xlsx
     Picture,  // .svg .pdf .png .jpg .jpeg .bmp
+    Html,     // .html .htm
+    Pdf,      // .pdf
     Json,     // any ending but one of the other kinds
     Text      // likewise
 };

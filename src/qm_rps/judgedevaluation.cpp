@@ -243,14 +243,22 @@ T_JUDGEMENT JudgeEvaluation(CDBDoc& doc, const T_PUSH_EVALUATION& result,
     return out;
 }
 
-std::string ReportOfJudgement(CDBDoc& doc, const T_PUSH_EVALUATION& result,
-                              const T_JUDGE_OPTIONS& options, const PUSH_PROGRESS_FN& progress)
+std::optional<T_JUDGEMENT> JudgementForReport(CDBDoc& doc, const T_PUSH_EVALUATION& result,
+                                              const T_JUDGE_OPTIONS& options,
+                                              const PUSH_PROGRESS_FN& progress)
 {
     const T_MODEL& model = doc.Data().Model();
     const bool hasHinges = std::ranges::any_of(model.hinges, [&](const auto& entry) {
         const auto type = model.hingeTypes.find(entry.second.hingeType);
         return type != model.hingeTypes.end() && type->second.generated;
     });
-    if (!options.code && !hasHinges) return {};
-    return JudgementReport(JudgeEvaluation(doc, result, options, progress));
+    if (!options.code && !hasHinges) return std::nullopt;
+    return JudgeEvaluation(doc, result, options, progress);
+}
+
+std::string ReportOfJudgement(CDBDoc& doc, const T_PUSH_EVALUATION& result,
+                              const T_JUDGE_OPTIONS& options, const PUSH_PROGRESS_FN& progress)
+{
+    const auto judgement = JudgementForReport(doc, result, options, progress);
+    return judgement ? JudgementReport(*judgement) : std::string();
 }

@@ -14,7 +14,11 @@
 T_JUDGEMENT JudgeEvaluation(CDBDoc& doc, const T_PUSH_EVALUATION& result,
                             const T_JUDGE_OPTIONS& options, const PUSH_PROGRESS_FN& progress);
 
-/// The judgement as the report of an evaluation has it; empty where no code is named and the model
-/// has no hinges that a code gave.
+/// The judgement that a report has; none where no code is named and the model has no hinges that a
+/// code gave.
+std::optional<T_JUDGEMENT> JudgementForReport(CDBDoc& doc, const T_PUSH_EVALUATION& result,
+                                              const T_JUDGE_OPTIONS& options,
+                                              const PUSH_PROGRESS_FN& progress);
+/// The same as text; empty where there is none.
 std::string ReportOfJudgement(CDBDoc& doc, const T_PUSH_EVALUATION& result,
                               const T_JUDGE_OPTIONS& options, const PUSH_PROGRESS_FN& progress);

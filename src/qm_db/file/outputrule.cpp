@@ -21,11 +21,13 @@ struct T_KIND {
 };
 
 // clang-format off
-constexpr std::array<T_KIND, 6> kKinds{{
+constexpr std::array<T_KIND, 8> kKinds{{
     {OUTPUT_KIND::Model,    "IDS_QM_OUTPUT_MODEL",    ".qmdb",                         true},
     {OUTPUT_KIND::Document, "IDS_QM_OUTPUT_DOCUMENT", ".qmdb .json",                   true},
     {OUTPUT_KIND::Sheet,    "IDS_QM_OUTPUT_SHEET",    ".xlsx",                         true},
     {OUTPUT_KIND::Picture,  "IDS_QM_OUTPUT_PICTURE",  ".svg .pdf .png .jpg .jpeg .bmp", true},
+    {OUTPUT_KIND::Html,     "IDS_QM_OUTPUT_HTML",     ".html .htm",                     true},
+    {OUTPUT_KIND::Pdf,      "IDS_QM_OUTPUT_PDF",      ".pdf",                           true},
     {OUTPUT_KIND::Json,     "IDS_QM_OUTPUT_JSON",     ".json",                         false},
     {OUTPUT_KIND::Text,     "IDS_QM_OUTPUT_TEXT",     ".txt",                          false},
 }};

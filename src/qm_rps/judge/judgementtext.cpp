@@ -97,15 +97,19 @@ struct T_SHOWN_ROWS {
     const char* more = "IDS_QM_JUDGE_MORE_ROWS";
 };
 
-std::string RowLines(const T_JUDGEMENT& j, const T_JUDGED_STATE& state, const T_SHOWN_ROWS& rows)
+std::size_t ShownRows(const T_JUDGED_STATE& state, std::size_t most)
+{
+    return most == 0 ? state.rows.size() : std::min(most, state.rows.size());
+}
+
+/// The head, then the rows.
+T_LINES RowsWithHead(const T_JUDGEMENT& j, const T_JUDGED_STATE& state, std::size_t most)
 {
     const auto heads = JudgedHeads(j.units);
     T_LINES lines(1);
     for (const C column : kShown)
         lines.front().push_back(heads[static_cast<std::size_t>(column)]);
-    const std::size_t shown =
-        rows.most == 0 ? state.rows.size() : std::min(rows.most, state.rows.size());
-    for (std::size_t i = 0; i < shown; ++i) {
+    for (std::size_t i = 0; i < ShownRows(state, most); ++i) {
         const T_JUDGED_CELLS cells = CellsOf(j, state, state.rows[i]);
         std::vector<std::string>& line = lines.emplace_back();
         for (const C column : kShown)
@@ -115,7 +119,13 @@ std::string RowLines(const T_JUDGEMENT& j, const T_JUDGED_STATE& state, const T_
     }
     const auto first = std::ranges::find(kShown, C::Other) - kShown.begin();
     const auto from = static_cast<std::size_t>(first);
-    std::string text = Table(WithoutEmpty(lines, from, from + 4));
+    return WithoutEmpty(lines, from, from + 4);
+}
+
+std::string RowLines(const T_JUDGEMENT& j, const T_JUDGED_STATE& state, const T_SHOWN_ROWS& rows)
+{
+    const std::size_t shown = ShownRows(state, rows.most);
+    std::string text = Table(RowsWithHead(j, state, rows.most));
     if (shown < state.rows.size())
         text += "  " + Say(rows.more, std::to_string(state.rows.size() - shown)) + '\n';
     return text;
@@ -271,4 +281,17 @@ std::string JudgementTrace(const T_JUDGEMENT& j)
                     "\n  " + StateText(j, state) + ", " + EndText(j.ends[row.end]) + '\n' + lines;
         }
     return text;
+}
+
+T_TEXT_TABLE JudgedTable(const T_JUDGEMENT& judgement, const T_JUDGED_STATE& state,
+                         std::size_t mostRows)
+{
+    const T_LINES lines = RowsWithHead(judgement, state, mostRows);
+    T_TEXT_TABLE table;
+    for (std::size_t c = 0; c < lines.front().size(); ++c) {
+        const bool isNumber = lines.size() > 1 && (ParseFinite(lines[1][c]) || lines[1][c] == "-");
+        table.columns.push_back({lines.front()[c], isNumber});
+    }
+    table.rows.assign(lines.begin() + 1, lines.end());
+    return table;
 }

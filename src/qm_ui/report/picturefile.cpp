@@ -152,44 +152,52 @@ private:
     std::unique_ptr<QGuiApplication> m_app;
 };
 
-int WriteAll(const QString& path, const QByteArray& bytes, std::string& error)
+int WriteAll(const std::string& path, const std::string& bytes, std::string& error)
 {
     T_FILE_ERROR fault;
-    const std::string_view text(bytes.constData(), static_cast<std::size_t>(bytes.size()));
-    const int done = CFileCtrl::WriteWholeFile(path.toStdString(), text, fault);
+    const int done = CFileCtrl::WriteWholeFile(path, bytes, fault);
     error = fault.text;
     return done;
 }
 
-int WriteChecked(const T_DRAWING& drawing, const QString& path, std::string& error)
-{
-    const T_FORMAT* format = FindFormat(path);
-    if (!format) {
-        error = path.toStdString() + ": unknown picture format, use .svg, .pdf, .png, .jpg or .bmp";
-        return 0;
-    }
-    const COffscreenApp app;
-    QByteArray bytes;
-    QBuffer buffer(&bytes);
-    if (!buffer.open(QIODevice::WriteOnly) || !format->paint(drawing, buffer) || bytes.isEmpty()) {
-        error = path.toStdString() + ": the picture can't be drawn";
-        return 0;
-    }
-    return WriteAll(path, bytes, error);
-}
-
 } // namespace
 
-int WritePictureFile(const T_DRAWING& drawing, const std::string& path, std::string& error)
+std::string SvgText(const T_DRAWING& drawing)
+{
+    QByteArray bytes;
+    QBuffer buffer(&bytes);
+    if (!buffer.open(QIODevice::WriteOnly) || !PaintSvg(drawing, buffer)) return {};
+    return bytes.toStdString();
+}
+
+int WriteOffscreen(const std::string& path, std::string& error,
+                   const std::function<std::string()>& make)
 {
     error.clear();
     try {
-        return WriteChecked(drawing, QString::fromStdString(path), error);
+        const COffscreenApp app;
+        const std::string bytes = make();
+        if (!bytes.empty()) return WriteAll(path, bytes, error);
+        error = path + ": " + Say("IDS_QM_UI_NOT_DRAWN");
     } catch (const std::bad_alloc&) {
         error = path + ": " + Say("IDS_QM_NO_MEMORY");
-        return 0;
     } catch (const std::exception& e) {
         error = path + ": " + e.what();
+    }
+    return 0;
+}
+
+int WritePictureFile(const T_DRAWING& drawing, const std::string& path, std::string& error)
+{
+    const T_FORMAT* format = FindFormat(QString::fromStdString(path));
+    if (!format) {
+        error = path + ": unknown picture format, use .svg, .pdf, .png, .jpg or .bmp";
         return 0;
     }
+    return WriteOffscreen(path, error, [&] {
+        QByteArray bytes;
+        QBuffer buffer(&bytes);
+        const bool done = buffer.open(QIODevice::WriteOnly) && format->paint(drawing, buffer);
+        return done ? bytes.toStdString() : std::string();
+    });
 }

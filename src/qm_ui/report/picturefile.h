@@ -22,3 +22,12 @@ struct T_DRAWING {
 /// or left as it was; nothing else stays behind. Numbers keep the C locale after the call.
 [[nodiscard]] int WritePictureFile(const T_DRAWING& drawing, const std::string& path,
                                    std::string& error);
+
+/// The drawing as the text of an SVG file.
+std::string SvgText(const T_DRAWING& drawing);
+
+/// Writes what `make` gives to a file, with a Qt application around it as above. 1 done; 0 error
+/// names the file: nothing was made, there is no memory, or the file can't be written; it is then as
+/// it was.
+[[nodiscard]] int WriteOffscreen(const std::string& path, std::string& error,
+                                 const std::function<std::string()>& make);
