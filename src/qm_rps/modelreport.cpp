@@ -4,6 +4,7 @@
 #include "qm_rps/evaluatedsteps.h"
 #include "qm_rps/judgedevaluation.h"
 #include "qm_rps/push/pushresultlist.h"
+#include "qm_rps/push/pushwarnings.h"
 #include "qm_rps/pushovercalculators.h"
 #include "qm_rps/unknownloadfactoritemdlg.h"
 #include "qm_rps/unknownloadfactorresultdlg.h"
@@ -61,6 +62,8 @@ private:
                 out.runFaults.push_back(id.name + ": " + error);
         }
         out.runs = std::move(runs);
+        for (std::string& warning : PushWarnings(m_doc))
+            out.runFaults.push_back(std::move(warning));
     }
 
     void Evaluate(T_REPORT_DATA& out)

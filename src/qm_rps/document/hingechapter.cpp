@@ -2,8 +2,10 @@
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
 #include "qm_db/recordfacts.h"
+#include "qm_rps/desk/codehingeoptions.h"
 #include "qm_rps/desk/elementlist.h"
 #include "qm_rps/document/reportmaker.h"
+#include "qm_rps/generate/codehingerows.h"
 #include "qm_rps/generate/generatedtypes.h"
 #include "qm_rps/hinge/hingelabels.h"
 
@@ -114,6 +116,30 @@ void AddComponent(T_REPORT_WORK& work, const T_PHGT_D& type, std::size_t i, T_DO
                                                T_BACKBONE_VIEW{shared, c, true}, kWidth});
 }
 
+/// Where the numbers of a generated type come from: made again for its first element as it was asked
+/// for. Nothing where that is refused today: the type is then stale, which is said.
+void AddTrace(T_REPORT_WORK& work, int element, T_DOC_CHAPTER& part)
+{
+    CCodeHingeOptions options(work.doc);
+    options.TakeStale({element});
+    T_CODE_REQUEST request;
+    T_CODE_HINGES made;
+    T_HINGE_REFUSAL refusal;
+    std::string reason;
+    if (!options.Read({element}, request, reason) ||
+        !CCodeHinges(work.doc).Preview(request, made, refusal) || made.elements.empty())
+        return;
+    for (const T_CODE_ROW_OF_HINGE& row : HingeRows(made.elements.front())) {
+        const std::string where = std::to_string(row.element) + " " + row.end + " " +
+                                  kComponentNames[static_cast<std::size_t>(row.component)] + " " +
+                                  row.side;
+        part.blocks.emplace_back(
+            T_DOC_FACTS{Say("IDS_QM_REPORT_TRACE", where), FactsOf(row.of->trace, work.Units())});
+        for (const T_CODE_WARNING& warning : row.of->warnings)
+            work.Remark(part.title, WarningText(warning));
+    }
+}
+
 void AddType(T_REPORT_WORK& work, int key, CGeneratedTypes& generated, T_DOC_CHAPTER& chapter)
 {
     T_PHGT_D type;
@@ -133,6 +159,7 @@ void AddType(T_REPORT_WORK& work, int key, CGeneratedTypes& generated, T_DOC_CHA
     }
     for (std::size_t i = 0; i < type.components.size(); ++i)
         if (type.components[i].active) AddComponent(work, type, i, part);
+    if (type.generated && !elements.empty()) AddTrace(work, elements.front(), part);
 }
 
 } // namespace

@@ -19,7 +19,7 @@ struct T_SOLVED_ITEM {
 struct T_REPORT_DATA {
     std::shared_ptr<const std::vector<T_PUSH_RUN>> runs =
         std::make_shared<std::vector<T_PUSH_RUN>>(); // results of our own, those of today's model
-    std::vector<std::string> runFaults;              // results that can't be shown, and why
+    std::vector<std::string> runFaults; // results that can't be shown and why, warnings of pushes
     std::vector<std::shared_ptr<const T_PUSH_EVALUATION>> evaluations;
     std::vector<T_HINGES_AT> hinges;                            // by evaluation
     std::vector<std::shared_ptr<const T_JUDGEMENT>> judgements; // of those that can be judged

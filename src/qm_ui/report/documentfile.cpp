@@ -8,6 +8,7 @@
 #include <QBuffer>
 #include <QCryptographicHash>
 #include <QFile>
+#include <QHashFunctions>
 #include <QPageSize>
 #include <QPainter>
 #include <QPdfWriter>
@@ -27,8 +28,18 @@ std::string InlineSvg(const T_DRAWING& drawing)
     return from == std::string::npos ? std::string() : svg.substr(from);
 }
 
+/// While it lives, hash tables have one order in every run: fonts of a PDF stand in that order.
+class CSameOrder {
+public:
+    CSameOrder() { QHashSeed::setDeterministicGlobalSeed(); }
+    CSameOrder(const CSameOrder&) = delete;
+    CSameOrder& operator=(const CSameOrder&) = delete;
+    ~CSameOrder() { QHashSeed::resetRandomGlobalSeed(); }
+};
+
 std::string PdfBytes(CDBDoc& doc, const T_DOCUMENT& document)
 {
+    const CSameOrder order;
     constexpr int kDpi = 1200;
     constexpr double kScreenDpi = 96.0;
     QByteArray bytes;

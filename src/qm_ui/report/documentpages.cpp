@@ -63,7 +63,10 @@ void CDocumentPages::Compose(std::vector<T_FLOW_PIECE> flow)
         const bool fits = y + flow[i].above + std::min(HeightOfGroup(flow, i), kTextHeight) <=
                           kTextHeight;
         const bool isTop = !m_pages.empty() && m_pages.back().empty();
-        if (m_pages.empty() || ((flow[i].onNewPage || !fits) && !isTop)) {
+        constexpr double kEnough = 0.6; // of the page: a chapter may still begin
+        const bool wantsNew = flow[i].onNewPage || (flow[i].opensChapter && y > kEnough * kTextHeight) ||
+                              (flow[i].opensChapter && m_pages.size() == 1);
+        if (m_pages.empty() || ((wantsNew || !fits) && !isTop)) {
             m_pages.emplace_back();
             y = 0.0;
             if (flow[i].head) {

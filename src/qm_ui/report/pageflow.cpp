@@ -84,7 +84,7 @@ public:
                        m_width},
                       kAbove, QColor(31, 78, 140));
         piece.keepWithNext = true;
-        piece.onNewPage = level == 1;
+        piece.opensChapter = level == 1;
         piece.level = static_cast<int>(level);
         piece.title = number + " " + chapter.title;
         m_out.push_back(std::move(piece));
@@ -104,7 +104,9 @@ public:
         if (!d.subtitle.empty())
             m_out.push_back(TextPiece({Q(d.subtitle), PageFont(kSubtitlePx), m_width}, 4.0 * kPx,
                                       QColor(90, 98, 110)));
-        m_out.push_back({12.0 * kPx, 0.0, true, false, [](QPainter&, QPointF) {}});
+        T_FLOW_PIECE gap{12.0 * kPx, 0.0, true};
+        gap.draw = [](QPainter&, QPointF) {};
+        m_out.push_back(std::move(gap));
         AddPairs(d.head, m_width, 0.0, m_out);
     }
 

@@ -18,6 +18,7 @@ struct T_FLOW_PIECE {
     double height = 0.0;
     bool keepWithNext = false; // a heading, a caption, the head of a table
     bool onNewPage = false;
+    bool opensChapter = false; // on a new page where little of this one is left
     std::function<void(QPainter&, QPointF)> draw{};
     /// Drawn again on top of every further page that the table needs; null: none.
     std::shared_ptr<const T_FLOW_PIECE> head{};

@@ -80,8 +80,9 @@ T_WIDTHS WidthsOf(const T_TEXT_TABLE& table, double px)
             wanted = std::max(wanted, WidthOf(text, font));
             least = std::max(least, column.number ? WidthOf(text, font) : WordWidthOf(text, font));
         }
-        w.wanted.push_back(wanted);
-        w.least.push_back(std::min(least, wanted));
+        constexpr double kSlack = 0.5 * kPx; // layouts round up
+        w.wanted.push_back(wanted + kSlack);
+        w.least.push_back(std::min(least, wanted) + kSlack);
     }
     return w;
 }
@@ -200,7 +201,7 @@ void AddTable(const T_DOC_TABLE& table, double width, std::vector<T_FLOW_PIECE>&
 void AddFacts(const T_DOC_FACTS& facts, double width, std::vector<T_FLOW_PIECE>& out)
 {
     AddCaption(facts.caption, width, out);
-    constexpr std::array shares{0.09, 0.29, 0.15, 0.31, 0.16};
+    constexpr std::array shares{0.09, 0.26, 0.15, 0.31, 0.19};
     for (const T_FACT& f : facts.facts) {
         std::string derived = f.formula;
         if (!f.numbers.empty()) derived += "\n= " + f.numbers;
