@@ -1,6 +1,7 @@
 #include "mainwindow.h"
 
 #include "explorerpane.h"
+#include "reporttools.h"
 #include "toolcommands.h"
 
 #include "qm_base/messagehistory.h"
@@ -224,6 +225,7 @@ T_COMMANDS CMainWindow::FileCommands()
             {kMenu, "IDS_QM_UI_EXPORT_PICTURE", "Ctrl+E", [this] { ExportPicture(); }},
             {kMenu, "IDS_QM_UI_PRINT", "Ctrl+P",
              [this] { (void)PrintDrawing(this, m_framePane->Drawing()); }},
+            ReportCommand(m_desktop),
             {kMenu},
             {kMenu, "IDS_QM_UI_EXIT", "Ctrl+Q", [this] { close(); }}};
 }

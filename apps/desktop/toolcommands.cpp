@@ -7,6 +7,8 @@
 #include "structuretools.h"
 #include "ulftools.h"
 
+#include "qm_ui/report/reportview.h"
+
 void RegisterViews(CViewFactory& factory)
 {
     RegisterPushViews(factory);
@@ -15,6 +17,7 @@ void RegisterViews(CViewFactory& factory)
     RegisterStructureViews(factory);
     RegisterHingeViews(factory);
     RegisterUlfViews(factory);
+    RegisterReportView(factory);
 }
 
 T_COMMANDS ToolCommands(T_DESKTOP& desktop)

@@ -5,6 +5,7 @@
 #include "mainwindow.h"
 #include "pushovertools.h"
 #include "pushtools.h"
+#include "reporttools.h"
 #include "structuretools.h"
 #include "ulftools.h"
 
@@ -28,7 +29,7 @@ std::vector<T_WINDOW_EXAMPLE> WindowExamples()
                                       {"main-bridge", "cable-stayed-bridge", shown(KIND::Static)},
                                       {"main-space", "space-frame-3d", shown(KIND::Static)}};
     for (auto& part : {PushWindowExamples(), PushoverWindowExamples(), LoadCaseWindowExamples(),
-                       StructureWindowExamples(), HingeWindowExamples(), UlfWindowExamples()})
+                       StructureWindowExamples(), ReportWindowExamples(), HingeWindowExamples(), UlfWindowExamples()})
         all.insert(all.end(), part.begin(), part.end());
     return all;
 }

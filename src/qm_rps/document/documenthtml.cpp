@@ -3,6 +3,8 @@
 #include "qm_base/say.h"
 #include "qm_rps/generate/codehingerows.h"
 
+#include <algorithm>
+
 namespace {
 
 constexpr const char* kStyle = R"(
@@ -89,8 +91,10 @@ public:
         m_out += "<div class=\"wide\"><table>";
         Caption(t.caption);
         m_out += "<tbody>\n";
+        const bool defined = std::ranges::any_of(
+            t.facts, [](const T_FACT& f) { return !f.definition.empty(); });
         for (const T_FACT& f : t.facts)
-            Fact(f);
+            Fact(f, defined);
         m_out += "</tbody></table></div>\n";
     }
 
@@ -125,13 +129,15 @@ private:
     {
         if (!text.empty()) m_out += "<caption>" + HtmlText(text) + "</caption>";
     }
-    void Fact(const T_FACT& f)
+    /// defined: some line of the table has a definition.
+    void Fact(const T_FACT& f, bool defined)
     {
         std::string derived = HtmlText(f.formula);
         if (!f.numbers.empty()) derived += "<br>= " + HtmlText(f.numbers);
         if (f.value && !f.text.empty()) derived += (derived.empty() ? "" : "<br>") + HtmlText(f.text);
-        m_out += "<tr><td>" + HtmlText(f.symbol) + "</td><td>" + HtmlText(f.definition) +
-                 "</td><td class=\"n\">" + HtmlText(f.ValueText()) + "</td><td class=\"f\">" +
+        m_out += "<tr><td>" + HtmlText(f.symbol) + "</td>" +
+                 (defined ? "<td>" + HtmlText(f.definition) + "</td>" : std::string()) +
+                 "<td class=\"n\">" + HtmlText(f.ValueText()) + "</td><td class=\"f\">" +
                  derived + "</td><td class=\"c\">" + HtmlText(f.clause) +
                  (f.mark == CODE_MARK::Recalled ? " (" + HtmlText(MarkText(f.mark)) + ")" : "") +
                  "</td></tr>\n";

@@ -38,7 +38,8 @@ T_DOC_TEXT TotalMass(const T_REPORT_WORK& work)
         return FormatText("%.6g", FromSi(si, work.Units(), kDimMass));
     };
     return DocText(Say("IDS_QM_REPORT_TOTAL_MASS", shown(sum[0]), shown(sum[1]), shown(sum[2]),
-                       UnitText(kDimMass, work.Units())));
+                       std::string(NameOf(work.Units().force)) + " s2/" +
+                           std::string(NameOf(work.Units().length))));
 }
 
 void AddTable(T_REPORT_WORK& work, EXPLORER_TABLE kind, T_DOC_CHAPTER& to)
@@ -100,12 +101,37 @@ void AddSections(T_REPORT_WORK& work, T_DOC_CHAPTER& chapter)
                                              std::to_string(count))));
 }
 
+/// Mean strengths and knowledge of existing materials.
+T_TEXT_TABLE AssessedValues(const T_REPORT_WORK& work)
+{
+    const std::string unit = " (" + UnitText(kDimStress, work.Units()) + ")";
+    T_TEXT_TABLE table{{{Say("IDS_QM_UI_HEAD_NAME")}, {"fc,m" + unit, true}, {"fy,m" + unit, true},
+                        {"fyw,m" + unit, true}, {Say("IDS_QM_REPORT_KNOWLEDGE")}, {"CF", true}},
+                       {}};
+    const auto stress = [&](double si) {
+        return si > 0.0 ? FormatText("%.6g", FromSi(si, work.Units(), kDimStress)) : "-";
+    };
+    for (const auto& [key, m] : work.Model().materials) {
+        if (!m.mean && !m.knowledge && !m.confidence) continue;
+        const T_MATL_MEAN mean = m.mean.value_or(T_MATL_MEAN{});
+        table.rows.push_back(
+            {m.name, stress(mean.fc), stress(mean.fy), stress(mean.fyw),
+             m.knowledge ? kKnowledgeNames[static_cast<std::size_t>(*m.knowledge)] : "-",
+             m.confidence ? FormatText("%.4g", *m.confidence) : "-"});
+    }
+    return table;
+}
+
 void AddMaterials(T_REPORT_WORK& work, T_DOC_CHAPTER& chapter)
 {
     if (work.Model().materials.empty()) return;
     T_DOC_CHAPTER& part = chapter.parts.emplace_back();
     part.title = Say("IDS_QM_REPORT_MATERIALS");
     AddTable(work, EXPLORER_TABLE::Materials, part);
+    T_TEXT_TABLE assessed = AssessedValues(work);
+    if (!assessed.rows.empty())
+        part.blocks.emplace_back(
+            DocTable(Say("IDS_QM_REPORT_ASSESSED"), std::move(assessed), work.limit));
 }
 
 } // namespace

@@ -201,7 +201,11 @@ void AddTable(const T_DOC_TABLE& table, double width, std::vector<T_FLOW_PIECE>&
 void AddFacts(const T_DOC_FACTS& facts, double width, std::vector<T_FLOW_PIECE>& out)
 {
     AddCaption(facts.caption, width, out);
-    constexpr std::array shares{0.09, 0.26, 0.15, 0.31, 0.19};
+    // Lines of a code's trace have no definitions.
+    const bool defined = std::ranges::any_of(
+        facts.facts, [](const T_FACT& f) { return !f.definition.empty(); });
+    const std::array shares = defined ? std::array{0.09, 0.26, 0.15, 0.31, 0.19}
+                                      : std::array{0.18, 0.0, 0.18, 0.42, 0.22};
     for (const T_FACT& f : facts.facts) {
         std::string derived = f.formula;
         if (!f.numbers.empty()) derived += "\n= " + f.numbers;
@@ -211,6 +215,7 @@ void AddFacts(const T_DOC_FACTS& facts, double width, std::vector<T_FLOW_PIECE>&
         const std::array texts{f.symbol, f.definition, f.ValueText(), derived, clause};
         std::vector<T_CELL> cells;
         for (std::size_t c = 0; c < texts.size(); ++c) {
+            if (!(shares[c] > 0.0)) continue;
             const bool isValue = c == 2 && f.value;
             cells.push_back({{Q(texts[c]), PageFont(kFactPx), shares[c] * width - 2.0 * kPad,
                               isValue ? Qt::AlignRight : Qt::AlignLeft}});

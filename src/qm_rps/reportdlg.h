@@ -1,0 +1,52 @@
+// Model of the window of the report: title block, chapters, preview, files.
+#pragma once
+
+#include "qm_base/mdialog.h"
+#include "qm_rps/modelreport.h"
+
+class CReportDlg : public zql::frx::MDialog {
+public:
+    /// The document must outlive the dialog.
+    explicit CReportDlg(CDBDoc& doc) : m_doc(doc) { m_chosen.fill(true); }
+
+    T_REPORT_D m_head; // its chapters are m_chosen
+    std::array<bool, kChapterNames.size()> m_chosen{};
+    int m_rows = 200; // of a table at most; 0: all
+    std::string m_fileHash;
+
+    static std::string ChapterText(std::size_t chapter);
+
+    /// Runs a long task and tells what is being made; set by the application. Empty: it just runs.
+    using TELL_FN = std::function<bool(const std::string&)>;
+    std::function<int(const std::function<int(const TELL_FN&)>&)> m_run;
+    /// Asks for the file to write; set by the application. Empty text: cancelled.
+    std::function<std::string(bool pdf)> m_askFile;
+    /// Writes the document as a page or as a PDF; set by the view. 1 done; 0 error says why not.
+    std::function<int(bool pdf, const std::string& path, std::string& error)> m_write;
+
+    /// Makes the document of the present settings. 1 made; 0 cancelled, or with a message: no
+    /// chapter is chosen, or the number of rows is negative. What was made before stays.
+    int OnMake();
+    /// Writes a file of the present settings. 1 written; 0 cancelled, or with a message.
+    int OnWrite(bool pdf);
+    /// The latest one, also where settings have changed since.
+    const T_DOCUMENT& Document() const { return m_document; }
+    bool IsMade() const { return m_times > 0; }
+    /// How often one was made.
+    int Times() const { return m_times; }
+    CDBDoc& Doc() { return m_doc; }
+    /// "12 pages; not of the present settings".
+    std::string StateText(std::size_t pages) const;
+
+private:
+    T_REPORT_OPTIONS Options() const;
+    bool IsCurrent() const;
+
+    CDBDoc& m_doc;
+    T_DOCUMENT m_document;
+    T_REPORT_D m_madeHead;
+    std::array<bool, kChapterNames.size()> m_madeChosen{};
+    int m_madeRows = 0;
+    long m_madeRevision = -1;
+    int m_times = 0;
+};
