@@ -44,6 +44,7 @@ void CPushedShears::TakeEnd(const T_STEP_FORCES& step, T_END& end)
 
 void CPushedShears::Take(const T_STEP_FORCES& step)
 {
+    if (step.of != FORCES_OF::Step) return;
     if (step.step == 0) Begin(step.run);
     for (T_END& end : m_ends)
         TakeEnd(step, end);
