@@ -129,7 +129,7 @@ std::string ParserWords(const std::string& what)
         const std::vector<std::string_view> views(args->begin(), args->end());
         // The upper end of positive numbers is the largest one, which the parser writes out.
         constexpr std::size_t kLongest = 40;
-        if (args->back().size() > kLongest && args->size() == 4)
+        if (args->size() == 4 && args->back().size() > kLongest)
             return Say("IDS_QM_CLI_ARG_ABOVE", (*args)[0], (*args)[1]);
         return zql::lib::FillPlaces(MMSGFunction::GetValue(key), views);
     }
