@@ -22,7 +22,7 @@ struct T_END_STATE : T_END_FORCES {
     double largestV = 0.0;    // magnitude, up to this state
 };
 inline constexpr std::array<double T_END_STATE::*, 8> kEndStateMembers{
-    &T_END_STATE::N,     &T_END_STATE::M,      &T_END_STATE::V,          &T_END_STATE::across,
+    &T_END_STATE::N,     &T_END_STATE::M,      &T_END_STATE::V,           &T_END_STATE::across,
     &T_END_STATE::chord, &T_END_STATE::flowed, &T_END_STATE::hingeMoment, &T_END_STATE::largestV};
 /// On the straight line from a (0) to b (1); beyond them too.
 T_END_STATE Between(const T_END_STATE& a, const T_END_STATE& b, double at);
