@@ -175,6 +175,7 @@ TEST(JudgedMaterials, RoundColumnsAreNotTakenForRectangles)
 TEST(JudgedMaterials, RowOfABeamGoesByTheShearOfTheState)
 {
     T_JUDGED_END end = OfConcrete(HINGE_CODE::Asce17, MEMBER_KIND::Beam);
+    end.hinge = 0;
     end.member.clear = 4.6;
     end.member.section.shape = SECT_SHAPE::Rectangle;
     end.member.section.size = {0.5, 0.3, 0.0, 0.0};
@@ -193,6 +194,7 @@ TEST(JudgedMaterials, RowOfABeamGoesByTheShearOfTheState)
 TEST(JudgedMaterials, RotationOfABeamWithAConnectionIsNotChecked)
 {
     T_JUDGED_END end = Foot(HINGE_CODE::Asce17, MEMBER_KIND::Beam);
+    end.hinge = 0;
     end.member.section.shape = SECT_SHAPE::IShape;
     end.member.section.size = {0.3, 0.15, 0.0071, 0.0107};
     SECT_FAULT fault = SECT_FAULT::None;

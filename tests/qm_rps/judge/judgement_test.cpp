@@ -61,7 +61,7 @@ T_END_STATE State(double chord, double V)
     T_END_STATE s;
     s.N = 640.0 * kN;
     s.V = V;
-    s.M = 3.0 * V;
+    s.M = s.hingeMoment = 3.0 * V;
     s.chord = chord;
     s.flowed = s.chord;
     return s;
@@ -171,9 +171,10 @@ TEST(Judgement, ShearSpanStaysWithinTheMember)
 // the shear, does not get the row of a small V.
 TEST(Judgement, RowsOfTablesKeepTheShearThatWas)
 {
-    T_END_STATE full = State(0.02, 60.0 * kN), lost = State(0.03, 15.0 * kN);
-    full.largestV = lost.largestV = 60.0 * kN;
-    const T_JUDGED_END end = Column(HINGE_CODE::Asce13);
+    T_END_STATE full = State(0.02, 400.0 * kN), lost = State(0.03, 15.0 * kN);
+    full.largestV = lost.largestV = 400.0 * kN; // 400 kN/(bw d sqrt f'c): beyond 6 in psi
+    T_JUDGED_END end = Column(HINGE_CODE::Asce17);
+    end.member.kind = MEMBER_KIND::Beam;
     const T_END_CHECKS before = Checked(end, full), after = Checked(end, lost);
     EXPECT_DOUBLE_EQ(before.At(kRotation, 2)->capacity, after.At(kRotation, 2)->capacity);
     lost.largestV = 15.0 * kN;
@@ -186,13 +187,13 @@ TEST(Judgement, EndTurnsAgainstItsChordToTheShearSpan)
 {
     T_JUDGED_END end = Column(HINGE_CODE::En1998);
     T_END_STATE s = State(0.03, 60.0 * kN);
-    s.M = 1e-9;
+    s.M = s.hingeMoment = 1e-9;
     s.flowed = 0.0;
     EXPECT_NEAR(0.0, Checked(end, s).At(kRotation, 2)->demand, 1e-15);
     s.flowed = 0.02;
     EXPECT_NEAR(0.02, Checked(end, s).At(kRotation, 2)->demand, 1e-15);
     s.flowed = 0.0;
-    s.M = 90.0 * kN;
+    s.M = s.hingeMoment = 90.0 * kN;
     s.V = 7.5 * kN;
     end.member.kind = MEMBER_KIND::Wall;
     EXPECT_NEAR(90e3 * 12.0 / (3.0 * 32e6), Checked(end, s).At(kRotation, 2)->demand, 1e-12);
