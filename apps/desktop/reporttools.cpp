@@ -4,8 +4,8 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_rps/reportdlg.h"
+#include "qm_ui/document/documentfile.h"
 #include "qm_ui/form/dialogwindow.h"
-#include "qm_ui/report/documentfile.h"
 
 namespace {
 
@@ -20,9 +20,9 @@ void Prepare(T_DESKTOP& desktop, CReportDlg& dialog)
     dialog.SetView(&desktop.view);
     dialog.m_fileHash = FileHash(desktop.doc.Path());
     dialog.m_askFile = [&desktop](bool pdf) {
-        return AskFileName(desktop.window, true, Text("IDS_QM_UI_REPORT_WINDOW"),
-                           Text(pdf ? "IDS_QM_UI_REPORT_PDF_FILTER"
-                                    : "IDS_QM_UI_REPORT_HTML_FILTER"))
+        return AskFileName(
+                   desktop.window, true, Text("IDS_QM_UI_REPORT_WINDOW"),
+                   Text(pdf ? "IDS_QM_UI_REPORT_PDF_FILTER" : "IDS_QM_UI_REPORT_HTML_FILTER"))
             .toStdString();
     };
     dialog.m_run = [&desktop](const std::function<int(const CReportDlg::TELL_FN&)>& work) {

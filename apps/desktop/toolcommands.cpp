@@ -7,7 +7,7 @@
 #include "structuretools.h"
 #include "ulftools.h"
 
-#include "qm_ui/report/reportview.h"
+#include "qm_ui/document/reportview.h"
 
 void RegisterViews(CViewFactory& factory)
 {

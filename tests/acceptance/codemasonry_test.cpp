@@ -60,8 +60,7 @@ TEST_F(CodeMasonry, MasonryTurnsAndSlides)
     r = generate("Circolare2019 --elements 2 --tie 50");
     EXPECT_EQ("spandrel", r["types"][0]["member"]);
     ExpectHinge(HingeOf(r, "My", "+-"),
-                {{"moment", 50 * 0.4 * (1 - 50 / (0.85 * 3450 * 0.4))}, {"NC", 0.02}}, 1e-9,
-                "tie");
+                {{"moment", 50 * 0.4 * (1 - 50 / (0.85 * 3450 * 0.4))}, {"NC", 0.02}}, 1e-9, "tie");
     // 0.4 135/1.5; 0.005 of 1.5 m.
     ExpectHinge(HingeOf(r, "Fz", "+-"), {{"force", 36.0}, {"NC", 0.0075}}, 1e-9, "h t ftd/b");
     EXPECT_EQ(std::string::npos, Done("hinge check g.json").find("generated"));

@@ -18,13 +18,13 @@ std::size_t CountOf(const std::string& text, const std::string& what)
 TEST_F(ModelReport, HasWhatWasFoundWithItsFormulasAndNumbers)
 {
     const std::string steps = std::string("@first-steps");
-    EXPECT_EQ("r.html\nr.pdf\n",
-              Done("report " + steps + " --html r.html --pdf r.pdf --project \"A & B <C>\" "
-                                       "--author \"A. Engineer\" --date 2026-11-23"));
+    EXPECT_EQ("r.html\nr.pdf\n", Done("report " + steps +
+                                      " --html r.html --pdf r.pdf --project \"A & B <C>\" "
+                                      "--author \"A. Engineer\" --date 2026-11-23"));
     const std::string html = Text("r.html");
     ExpectHolds(html, {"A &amp; B &lt;C&gt;", "A. Engineer", "2026-11-23", "1.28571", "0.857143",
-                       "M alpha / Gamma", "300 x 0.857143 / 1.28571", "200 kN s2/m", "0.0996", "783.6",
-                       "63.7 (ay dpi - dy api) / (api dpi)", "ATC-40 8.2.2.1.1", "<svg"});
+                       "M alpha / Gamma", "300 x 0.857143 / 1.28571", "200 kN s2/m", "0.0996",
+                       "783.6", "63.7 (ay dpi - dy api) / (api dpi)", "ATC-40 8.2.2.1.1", "<svg"});
     // Nothing is loaded from elsewhere, nothing runs.
     for (const char* const no : {"<script", "src=", "@import", "url(http"})
         EXPECT_EQ(0U, CountOf(html, no)) << no;
@@ -32,8 +32,9 @@ TEST_F(ModelReport, HasWhatWasFoundWithItsFormulasAndNumbers)
     EXPECT_TRUE(pdf.starts_with("%PDF-"));
     EXPECT_EQ(0U, CountOf(pdf, "CreationDate"));
     EXPECT_GE(CountOf(pdf, "/Dest"), CountOf(html, "<h2 id=") + CountOf(html, "<h3 id="));
-    Done("report " + steps + " --html s.html --pdf s.pdf --project \"A & B <C>\" "
-                             "--author \"A. Engineer\" --date 2026-11-23");
+    Done("report " + steps +
+         " --html s.html --pdf s.pdf --project \"A & B <C>\" "
+         "--author \"A. Engineer\" --date 2026-11-23");
     EXPECT_EQ(html, Text("s.html"));
     EXPECT_EQ(pdf, Text("s.pdf"));
 }
@@ -55,7 +56,8 @@ TEST_F(ModelReport, TakesChaptersAndSpeaksItalian)
 // Verdicts, remarks and traces of hinges that a code gave.
 TEST_F(ModelReport, JudgesWhatACodeGave)
 {
-    Done("hinge generate " + std::string("@rc-frame-code-hinges") + " --code EN1998-3 --all -o g.json");
+    Done("hinge generate " + std::string("@rc-frame-code-hinges") +
+         " --code EN1998-3 --all -o g.json");
     Done("report g.json --html r.html");
     ExpectHolds(Text("r.html"), {"Verdicts of members", "EN 1998-3 (A.1)", "theta_um",
                                  "recalled from memory", "Where the numbers come from: element 1"});

@@ -6,7 +6,7 @@
 #include "push/pushfirst.h"
 #include "qm_base/say.h"
 #include "qm_rps/modelreport.h"
-#include "qm_ui/report/documentfile.h"
+#include "qm_ui/document/documentfile.h"
 
 #include <cstdio>
 #include <filesystem>

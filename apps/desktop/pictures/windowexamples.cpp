@@ -29,7 +29,8 @@ std::vector<T_WINDOW_EXAMPLE> WindowExamples()
                                       {"main-bridge", "cable-stayed-bridge", shown(KIND::Static)},
                                       {"main-space", "space-frame-3d", shown(KIND::Static)}};
     for (auto& part : {PushWindowExamples(), PushoverWindowExamples(), LoadCaseWindowExamples(),
-                       StructureWindowExamples(), ReportWindowExamples(), HingeWindowExamples(), UlfWindowExamples()})
+                       StructureWindowExamples(), ReportWindowExamples(), HingeWindowExamples(),
+                       UlfWindowExamples()})
         all.insert(all.end(), part.begin(), part.end());
     return all;
 }

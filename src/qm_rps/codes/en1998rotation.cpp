@@ -96,7 +96,8 @@ bool SoundMember(const T_EN_MEMBER& m, CCodeSheet& sheet)
 {
     sheet.Positive({{"b", m.b}, {"h", m.h}, {"d", m.d}, {"dPrime", m.dPrime}});
     sheet.Positive({{"fc", m.fc}, {"fy", m.fy}, {"Es", m.Es}, {"shearSpan", m.shearSpan}});
-    sheet.Positive({{"As", m.As}, {"As2 (compressed side)", m.AsPrime}, {"barDiameter", m.barDiameter}});
+    sheet.Positive(
+        {{"As", m.As}, {"As2 (compressed side)", m.AsPrime}, {"barDiameter", m.barDiameter}});
     sheet.NotNegative({{"AsWeb", m.AsWeb}, {"fyw", m.fyw}, {"hoopRatio", m.hoopRatio}});
     sheet.NotNegative({{"diagonalRatio", m.diagonalRatio}, {"lapRatio", m.lapRatio}});
     if (sheet.Sound()) sheet.Within("d", m.d, m.dPrime * (1.0 + 1e-9), m.h);

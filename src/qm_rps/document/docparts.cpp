@@ -20,8 +20,8 @@ void DropEmpty(T_TEXT_TABLE& table)
         return cell.empty() || cell == "0" || cell == "-";
     };
     for (std::size_t c = table.columns.size(); c-- > 1;) {
-        const bool isEmpty = std::ranges::all_of(
-            table.rows, [&](const auto& row) { return isNothing(row[c]); });
+        const bool isEmpty =
+            std::ranges::all_of(table.rows, [&](const auto& row) { return isNothing(row[c]); });
         if (!isEmpty) continue;
         const auto at = static_cast<std::ptrdiff_t>(c);
         table.columns.erase(table.columns.begin() + at);
@@ -56,8 +56,8 @@ T_DOC_TABLE DocTable(std::string caption, T_TEXT_TABLE table, T_TABLE_LIMIT limi
     const std::size_t all = table.rows.size();
     if (limit.most > 0 && all > limit.most) {
         table.rows.resize(limit.most);
-        caption += " (" + Say("IDS_QM_REPORT_ROWS", std::to_string(limit.most), std::to_string(all)) +
-                   ")";
+        caption +=
+            " (" + Say("IDS_QM_REPORT_ROWS", std::to_string(limit.most), std::to_string(all)) + ")";
     }
     return {std::move(caption), std::move(table)};
 }
@@ -68,8 +68,7 @@ T_DOC_TABLE RecordsTable(CDBDoc& doc, EXPLORER_TABLE kind, T_TABLE_LIMIT limit)
     T_TEXT_TABLE table;
     for (std::size_t c = 0; c < grid->Columns(); ++c)
         table.columns.push_back({grid->ColumnHead(c), IsNumber(grid->Kind(c))});
-    const std::size_t rows =
-        limit.most > 0 ? std::min(limit.most, grid->Rows()) : grid->Rows();
+    const std::size_t rows = limit.most > 0 ? std::min(limit.most, grid->Rows()) : grid->Rows();
     for (std::size_t r = 0; r < rows; ++r) {
         auto& row = table.rows.emplace_back();
         for (std::size_t c = 0; c < grid->Columns(); ++c)

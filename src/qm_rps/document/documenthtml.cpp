@@ -63,8 +63,8 @@ public:
     void operator()(const T_DOC_TEXT& t)
     {
         const char* const tag = t.mono ? "pre" : "p";
-        m_out += Open(tag, ClassOf(t.tone)) + SignOf(t.tone) + HtmlText(t.text) + "</" + tag +
-                 ">\n";
+        m_out +=
+            Open(tag, ClassOf(t.tone)) + SignOf(t.tone) + HtmlText(t.text) + "</" + tag + ">\n";
     }
 
     void operator()(const T_DOC_TABLE& t)
@@ -91,8 +91,8 @@ public:
         m_out += "<div class=\"wide\"><table>";
         Caption(t.caption);
         m_out += "<tbody>\n";
-        const bool defined = std::ranges::any_of(
-            t.facts, [](const T_FACT& f) { return !f.definition.empty(); });
+        const bool defined =
+            std::ranges::any_of(t.facts, [](const T_FACT& f) { return !f.definition.empty(); });
         for (const T_FACT& f : t.facts)
             Fact(f, defined);
         m_out += "</tbody></table></div>\n";
@@ -103,8 +103,9 @@ public:
         const std::string svg = m_svg ? m_svg(p) : std::string();
         if (svg.empty()) return;
         constexpr double kPercent = 100.0;
-        m_out += "<figure style=\"max-width:" + std::to_string(static_cast<int>(p.width * kPercent)) +
-                 "%\">" + svg + "<figcaption>" + HtmlText(p.caption) + "</figcaption></figure>\n";
+        m_out +=
+            "<figure style=\"max-width:" + std::to_string(static_cast<int>(p.width * kPercent)) +
+            "%\">" + svg + "<figcaption>" + HtmlText(p.caption) + "</figcaption></figure>\n";
     }
 
     void Chapter(const T_DOC_CHAPTER& chapter, std::vector<std::size_t> place)
@@ -134,11 +135,12 @@ private:
     {
         std::string derived = HtmlText(f.formula);
         if (!f.numbers.empty()) derived += "<br>= " + HtmlText(f.numbers);
-        if (f.value && !f.text.empty()) derived += (derived.empty() ? "" : "<br>") + HtmlText(f.text);
+        if (f.value && !f.text.empty())
+            derived += (derived.empty() ? "" : "<br>") + HtmlText(f.text);
         m_out += "<tr><td>" + HtmlText(f.symbol) + "</td>" +
                  (defined ? "<td>" + HtmlText(f.definition) + "</td>" : std::string()) +
-                 "<td class=\"n\">" + HtmlText(f.ValueText()) + "</td><td class=\"f\">" +
-                 derived + "</td><td class=\"c\">" + HtmlText(f.clause) +
+                 "<td class=\"n\">" + HtmlText(f.ValueText()) + "</td><td class=\"f\">" + derived +
+                 "</td><td class=\"c\">" + HtmlText(f.clause) +
                  (f.mark == CODE_MARK::Recalled ? " (" + HtmlText(MarkText(f.mark)) + ")" : "") +
                  "</td></tr>\n";
     }
@@ -155,8 +157,8 @@ void AddContents(const std::vector<T_DOC_CHAPTER>& chapters, std::vector<std::si
     for (const T_DOC_CHAPTER& chapter : chapters) {
         ++place.back();
         const std::string number = ChapterNumber(place);
-        out += "<li><a href=\"#c" + number + "\">" + number + " " + HtmlText(chapter.title) +
-               "</a>";
+        out +=
+            "<li><a href=\"#c" + number + "\">" + number + " " + HtmlText(chapter.title) + "</a>";
         AddContents(chapter.parts, place, out);
         out += "</li>\n";
     }

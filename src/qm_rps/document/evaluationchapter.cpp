@@ -30,7 +30,7 @@ DOC_TONE ToneOf(const T_PUSH_EVALUATION& e)
 DOC_TONE ToneOf(const T_LIMIT_ROW& row)
 {
     if (row.remark == "OK") return DOC_TONE::Good;
-    return row.remark.empty()        ? DOC_TONE::Plain
+    return row.remark.empty()          ? DOC_TONE::Plain
            : row.remark == kNotChecked ? DOC_TONE::Warning
                                        : DOC_TONE::Bad;
 }
@@ -102,17 +102,15 @@ void AddJudgement(T_REPORT_WORK& work, const std::shared_ptr<const T_JUDGEMENT>&
     constexpr std::size_t kMostEnds = 20;
     for (std::size_t s = 0; s < j->states.size(); ++s) {
         const T_JUDGED_STATE& state = j->states[s];
-        T_DOC_TABLE table =
-            DocTable(StateAtText(*j, state) + ": " + VerdictCountText(state.all),
-                     JudgedTable(*j, state, kMostEnds), {});
+        T_DOC_TABLE table = DocTable(StateAtText(*j, state) + ": " + VerdictCountText(state.all),
+                                     JudgedTable(*j, state, kMostEnds), {});
         for (std::size_t r = 0; r < table.table.rows.size(); ++r)
             table.tones.push_back(ToneOf(state.rows[r].verdict));
         part.blocks.emplace_back(std::move(table));
         for (const std::string& why : UncheckedTexts(state))
             part.blocks.emplace_back(DocText(why, DOC_TONE::Warning));
         if (&state == WorstState(*j))
-            part.blocks.emplace_back(
-                T_DOC_PICTURE{StateAtText(*j, state), T_JUDGEMENT_VIEW{j, s}});
+            part.blocks.emplace_back(T_DOC_PICTURE{StateAtText(*j, state), T_JUDGEMENT_VIEW{j, s}});
     }
     chapter.parts.push_back(std::move(part));
 }

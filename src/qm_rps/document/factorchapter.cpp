@@ -18,24 +18,22 @@ T_TEXT_TABLE FactorTable(const T_ULF_RESULT& r)
                         {Say("IDS_QM_CLI_FACTOR"), true}},
                        {}};
     for (std::size_t i = 0; i < r.cases.size(); ++i)
-        table.rows.push_back(
-            {r.cases[i].name,
-             Say(r.cases[i].unknown ? "IDS_QM_CLI_UNKNOWN" : "IDS_QM_CLI_KNOWN"),
-             Number(UlfShownFactor(r, i))});
+        table.rows.push_back({r.cases[i].name,
+                              Say(r.cases[i].unknown ? "IDS_QM_CLI_UNKNOWN" : "IDS_QM_CLI_KNOWN"),
+                              Number(UlfShownFactor(r, i))});
     return table;
 }
 
 T_DOC_TABLE ConstraintTable(const T_REPORT_WORK& work, const T_ULF_RESULT& r)
 {
-    T_TEXT_TABLE table{
-        {{Say("IDS_QM_CLI_CONSTRAINT")},
-         {Say(r.linearForecast ? "IDS_QM_CLI_FORECAST" : "IDS_QM_CLI_VALUE"), true},
-         {Say("IDS_QM_CLI_LOWER"), true},
-         {Say("IDS_QM_CLI_UPPER"), true},
-         {Say("IDS_QM_CLI_MISSED_BY"), true},
-         {Say("IDS_QM_CLI_UNIT")},
-         {Say("IDS_QM_CLI_STATE")}},
-        {}};
+    T_TEXT_TABLE table{{{Say("IDS_QM_CLI_CONSTRAINT")},
+                        {Say(r.linearForecast ? "IDS_QM_CLI_FORECAST" : "IDS_QM_CLI_VALUE"), true},
+                        {Say("IDS_QM_CLI_LOWER"), true},
+                        {Say("IDS_QM_CLI_UPPER"), true},
+                        {Say("IDS_QM_CLI_MISSED_BY"), true},
+                        {Say("IDS_QM_CLI_UNIT")},
+                        {Say("IDS_QM_CLI_STATE")}},
+                       {}};
     std::vector<DOC_TONE> tones;
     const auto rows = UlfResultRows(r);
     for (std::size_t i = 0; i < rows.size(); ++i) {
@@ -90,8 +88,7 @@ void FillFactorsChapter(T_REPORT_WORK& work, T_DOC_CHAPTER& chapter)
         part.blocks.emplace_back(
             DocText(Say("IDS_QM_CLI_OBJECTIVE", FormatText("%.9g", UlfObjective(r)))));
         if (r.linearForecast) {
-            part.blocks.emplace_back(
-                DocText(Say("IDS_QM_ULF_LINEAR_FORECAST"), DOC_TONE::Warning));
+            part.blocks.emplace_back(DocText(Say("IDS_QM_ULF_LINEAR_FORECAST"), DOC_TONE::Warning));
             work.Remark(item.name, Say("IDS_QM_ULF_LINEAR_FORECAST"));
         }
         if (const std::string misses = UlfMisses(r); !misses.empty())
@@ -108,11 +105,10 @@ void FillStagesChapter(T_REPORT_WORK& work, T_DOC_CHAPTER& chapter)
     if (work.Model().stages.empty()) return;
     chapter.blocks.emplace_back(RecordsTable(work.doc, EXPLORER_TABLE::Stages, work.limit));
     const T_STCT_D& control = work.Model().styp.stageControl;
-    chapter.blocks.emplace_back(
-        DocText(Say("IDS_QM_REPORT_STAGE_CONTROL",
-                    kStageBirthNames[static_cast<std::size_t>(control.birth)],
-                    Say(control.geometricStiffness ? "IDS_QM_FACT_YES" : "IDS_QM_FACT_NO"),
-                    Say(control.cableSag ? "IDS_QM_FACT_YES" : "IDS_QM_FACT_NO"))));
+    chapter.blocks.emplace_back(DocText(Say(
+        "IDS_QM_REPORT_STAGE_CONTROL", kStageBirthNames[static_cast<std::size_t>(control.birth)],
+        Say(control.geometricStiffness ? "IDS_QM_FACT_YES" : "IDS_QM_FACT_NO"),
+        Say(control.cableSag ? "IDS_QM_FACT_YES" : "IDS_QM_FACT_NO"))));
 }
 
 void FillRemarksChapter(T_REPORT_WORK& work, T_DOC_CHAPTER& chapter)

@@ -48,9 +48,8 @@ T_TEXT_TABLE BackboneTable(const std::vector<T_SIDE_ROW>& rows, HINGE_COMPONENT 
     T_TEXT_TABLE table{{{Say("IDS_QM_REPORT_END")}, {Say("IDS_QM_REPORT_SIDE")}}, {}};
     table.columns.push_back({StrengthHead(Say("IDS_QM_REPORT_YIELD"), c, owner), true});
     table.columns.push_back({DeformHead("Dy", c, owner), true});
-    for (const char* const head :
-         {"B: D", "B: S/Sy", "C: D", "C: S/Sy", "D: D", "D: S/Sy", "E: D", "E: S/Sy", "IO", "LS",
-          "CP"})
+    for (const char* const head : {"B: D", "B: S/Sy", "C: D", "C: S/Sy", "D: D", "D: S/Sy", "E: D",
+                                   "E: S/Sy", "IO", "LS", "CP"})
         table.columns.push_back({head, true});
     for (const T_SIDE_ROW& row : rows) {
         auto& cells = table.rows.emplace_back(std::vector<std::string>{row.end, row.side});
@@ -70,16 +69,14 @@ T_TEXT_TABLE BackboneTable(const std::vector<T_SIDE_ROW>& rows, HINGE_COMPONENT 
 T_TEXT_TABLE MultiTable(const T_HINGE_COMPONENT& component)
 {
     T_TEXT_TABLE table{{{Say("IDS_QM_REPORT_END")}, {Say("IDS_QM_REPORT_SIDE")}}, {}};
-    for (const char* const head :
-         {"P1", "P2", "P3", "D1", "D2", "D3", "alpha1", "alpha2", "gap"})
+    for (const char* const head : {"P1", "P2", "P3", "D1", "D2", "D3", "alpha1", "alpha2", "gap"})
         table.columns.push_back({head, true});
     const auto add = [&](const T_SKEL_CURVE& curve, const std::string& end) {
         const auto* multi = std::get_if<T_SKEL_MULTI>(&curve);
         if (!multi) return;
         const auto side = [&](const std::string& name, const T_SKEL_MULTI_SIDE& s) {
             auto& cells = table.rows.emplace_back(std::vector<std::string>{end, name});
-            for (const double v :
-                 {s.P1, s.P2, s.P3, s.D1, s.D2, s.D3, s.alpha1, s.alpha2, s.gap})
+            for (const double v : {s.P1, s.P2, s.P3, s.D1, s.D2, s.D3, s.alpha1, s.alpha2, s.gap})
                 cells.push_back(FormatText("%.5g", v));
         };
         side(multi->symmetric ? "+/-" : "+", multi->sides.pos);
@@ -116,8 +113,8 @@ void AddComponent(T_REPORT_WORK& work, const T_PHGT_D& type, std::size_t i, T_DO
                                                T_BACKBONE_VIEW{shared, c, true}, kWidth});
 }
 
-/// Where the numbers of a generated type come from: made again for its first element as it was asked
-/// for. Nothing where that is refused today: the type is then stale, which is said.
+/// Where the numbers of a generated type come from: made again for its first element as it was
+/// asked for. Nothing where that is refused today: the type is then stale, which is said.
 void AddTrace(T_REPORT_WORK& work, int element, T_DOC_CHAPTER& part)
 {
     CCodeHingeOptions options(work.doc);
@@ -147,9 +144,10 @@ void AddType(T_REPORT_WORK& work, int key, CGeneratedTypes& generated, T_DOC_CHA
     T_DOC_CHAPTER& part = chapter.parts.emplace_back();
     part.title = type.name;
     const std::vector<int> elements = ElementsWithHingeType(work.Model(), key);
-    std::string text = ElementText(type.element) + ". " +
-                       (elements.empty() ? Say("IDS_QM_REPORT_NO_ELEMENTS")
-                                         : Say("IDS_QM_REPORT_ON_ELEMENTS", ElementListText(elements)));
+    std::string text =
+        ElementText(type.element) + ". " +
+        (elements.empty() ? Say("IDS_QM_REPORT_NO_ELEMENTS")
+                          : Say("IDS_QM_REPORT_ON_ELEMENTS", ElementListText(elements)));
     if (const std::string code = generated.CodeText(key); !code.empty())
         text += " " + Say("IDS_QM_REPORT_OF_CODE", code);
     part.blocks.emplace_back(DocText(text));
@@ -176,6 +174,6 @@ void FillHingesChapter(T_REPORT_WORK& work, T_DOC_CHAPTER& chapter)
     for (const auto& [key, type] : work.Model().hingeTypes)
         if (++count <= kMostTypes) AddType(work, key, generated, chapter);
     if (count > kMostTypes)
-        chapter.blocks.emplace_back(DocText(Say("IDS_QM_REPORT_MORE_TYPES",
-                                                std::to_string(kMostTypes), std::to_string(count))));
+        chapter.blocks.emplace_back(DocText(
+            Say("IDS_QM_REPORT_MORE_TYPES", std::to_string(kMostTypes), std::to_string(count))));
 }

@@ -8,7 +8,6 @@
 
 namespace {
 
-
 T_DOC_TEXT Overview(const T_REPORT_WORK& work)
 {
     const T_MODEL& m = work.Model();
@@ -20,8 +19,8 @@ T_DOC_TEXT Overview(const T_REPORT_WORK& work)
     text += " " + Say("IDS_QM_REPORT_GRAVITY", FormatText("%.6g", g),
                       std::string(NameOf(work.Units().length)));
     if (m.styp.plane)
-        text += " " + Say("IDS_QM_REPORT_PLANE",
-                          kPlaneNames[static_cast<std::size_t>(*m.styp.plane)]);
+        text +=
+            " " + Say("IDS_QM_REPORT_PLANE", kPlaneNames[static_cast<std::size_t>(*m.styp.plane)]);
     for (const auto* code : {&m.styp.designCodes.concrete, &m.styp.designCodes.steel})
         if (*code) text += " " + Say("IDS_QM_REPORT_DESIGN_CODE", **code);
     return DocText(text);
@@ -57,10 +56,10 @@ T_TEXT_TABLE SectionValues(const T_REPORT_WORK& work)
         double T_SECT_D::*value;
     };
     using S = T_SECT_D;
-    constexpr T_COLUMN columns[] = {
-        {"A", {0, 2}, &S::area}, {"Asy", {0, 2}, &S::Asy}, {"Asz", {0, 2}, &S::Asz},
-        {"J", {0, 4}, &S::J},    {"Iy", {0, 4}, &S::Iyy},  {"Iz", {0, 4}, &S::Izz},
-        {"Wpl,y", {0, 3}, &S::Zy}, {"Wpl,z", {0, 3}, &S::Zz}};
+    constexpr T_COLUMN columns[] = {{"A", {0, 2}, &S::area},   {"Asy", {0, 2}, &S::Asy},
+                                    {"Asz", {0, 2}, &S::Asz},  {"J", {0, 4}, &S::J},
+                                    {"Iy", {0, 4}, &S::Iyy},   {"Iz", {0, 4}, &S::Izz},
+                                    {"Wpl,y", {0, 3}, &S::Zy}, {"Wpl,z", {0, 3}, &S::Zz}};
     T_TEXT_TABLE table{{{Say("IDS_QM_UI_HEAD_NAME")}}, {}};
     for (const T_COLUMN& c : columns)
         table.columns.push_back(
@@ -71,8 +70,8 @@ T_TEXT_TABLE SectionValues(const T_REPORT_WORK& work)
         SECT_FAULT fault{};
         const bool sound = CSectionProperties::Calc(section, full, fault) != 0;
         for (const T_COLUMN& c : columns)
-            row.push_back(
-                sound ? FormatText("%.6g", FromSi(full.*c.value, work.Units(), c.dim)) : "-");
+            row.push_back(sound ? FormatText("%.6g", FromSi(full.*c.value, work.Units(), c.dim))
+                                : "-");
     }
     return table;
 }
@@ -96,17 +95,20 @@ void AddSections(T_REPORT_WORK& work, T_DOC_CHAPTER& chapter)
                 T_DOC_PICTURE{section.name, T_SECTION_VIEW{shown, work.Units()}, kWidth});
     }
     if (count > kMostPictures)
-        part.blocks.emplace_back(DocText(Say("IDS_QM_REPORT_MORE_PICTURES",
-                                             std::to_string(kMostPictures),
-                                             std::to_string(count))));
+        part.blocks.emplace_back(DocText(Say(
+            "IDS_QM_REPORT_MORE_PICTURES", std::to_string(kMostPictures), std::to_string(count))));
 }
 
 /// Mean strengths and knowledge of existing materials.
 T_TEXT_TABLE AssessedValues(const T_REPORT_WORK& work)
 {
     const std::string unit = " (" + UnitText(kDimStress, work.Units()) + ")";
-    T_TEXT_TABLE table{{{Say("IDS_QM_UI_HEAD_NAME")}, {"fc,m" + unit, true}, {"fy,m" + unit, true},
-                        {"fyw,m" + unit, true}, {Say("IDS_QM_REPORT_KNOWLEDGE")}, {"CF", true}},
+    T_TEXT_TABLE table{{{Say("IDS_QM_UI_HEAD_NAME")},
+                        {"fc,m" + unit, true},
+                        {"fy,m" + unit, true},
+                        {"fyw,m" + unit, true},
+                        {Say("IDS_QM_REPORT_KNOWLEDGE")},
+                        {"CF", true}},
                        {}};
     const auto stress = [&](double si) {
         return si > 0.0 ? FormatText("%.6g", FromSi(si, work.Units(), kDimStress)) : "-";
@@ -157,7 +159,8 @@ namespace {
 /// A load of a case in one line.
 T_TEXT_TABLE LoadRows(const T_REPORT_WORK& work, const T_STLD_D& c)
 {
-    T_TEXT_TABLE table{{{Say("IDS_QM_REPORT_LOAD")}, {Say("IDS_QM_REPORT_LOAD_AT")},
+    T_TEXT_TABLE table{{{Say("IDS_QM_REPORT_LOAD")},
+                        {Say("IDS_QM_REPORT_LOAD_AT")},
                         {Say("IDS_QM_REPORT_LOAD_VALUES")}},
                        {}};
     const std::string L(NameOf(work.Units().length)), F(NameOf(work.Units().force));
@@ -180,12 +183,11 @@ T_TEXT_TABLE LoadRows(const T_REPORT_WORK& work, const T_STLD_D& c)
             list(l.load, kReactionNames, forceUnit));
     for (const T_BEAM_LOAD& l : c.beam) {
         const std::string axes = kLoadAxesNames[static_cast<std::size_t>(l.axes)],
-                          direction =
-                              kLoadDirectionNames[static_cast<std::size_t>(l.direction)];
+                          direction = kLoadDirectionNames[static_cast<std::size_t>(l.direction)];
         const bool spread = l.type == BEAM_LOAD_TYPE::Distributed;
-        const std::string unit = spread                               ? F + "/" + L
+        const std::string unit = spread                             ? F + "/" + L
                                  : l.type == BEAM_LOAD_TYPE::Moment ? F + " " + L
-                                                                      : F;
+                                                                    : F;
         std::string values = kBeamLoadNames[static_cast<std::size_t>(l.type)] +
                              (" " + axes + " " + direction + ": ") + FormatText("%.6g", l.w[0]);
         if (spread && l.w[1] != l.w[0]) values += " ... " + FormatText("%.6g", l.w[1]);

@@ -78,14 +78,12 @@ T_TEXT_TABLE EventTable(const T_REPORT_WORK& work, const T_PUSH_RUN& run)
 T_TEXT_TABLE StoreyTable(const T_REPORT_WORK& work, const T_PUSH_RUN& run)
 {
     const T_UNITS& units = work.Units();
-    T_TEXT_TABLE table{{{Say("IDS_QM_REPORT_STOREY")},
-                        {Say("IDS_QM_REPORT_DISPLACEMENT") + " (" +
-                             std::string(NameOf(units.length)) + ")",
-                         true},
-                        {Say("IDS_QM_REPORT_DRIFT"), true},
-                        {Say("IDS_QM_REPORT_SHEAR") + " (" + std::string(NameOf(units.force)) + ")",
-                         true}},
-                       {}};
+    T_TEXT_TABLE table{
+        {{Say("IDS_QM_REPORT_STOREY")},
+         {Say("IDS_QM_REPORT_DISPLACEMENT") + " (" + std::string(NameOf(units.length)) + ")", true},
+         {Say("IDS_QM_REPORT_DRIFT"), true},
+         {Say("IDS_QM_REPORT_SHEAR") + " (" + std::string(NameOf(units.force)) + ")", true}},
+        {}};
     const std::size_t last = run.displacement.size() - 1;
     for (const T_PUSH_STOREY_SERIES& s : run.storeys)
         table.rows.push_back(
@@ -100,8 +98,7 @@ void AddRun(T_REPORT_WORK& work, const T_PUSH_RUN& run, T_DOC_CHAPTER& chapter)
 {
     T_DOC_CHAPTER& part = chapter.parts.emplace_back();
     part.title = run.name;
-    const DOC_TONE tone =
-        run.status == PUSH_STATUS::Failed ? DOC_TONE::Warning : DOC_TONE::Plain;
+    const DOC_TONE tone = run.status == PUSH_STATUS::Failed ? DOC_TONE::Warning : DOC_TONE::Plain;
     part.blocks.emplace_back(DocText(run.outcome + ". " + run.advice, tone));
     if (run.status == PUSH_STATUS::Failed) work.Remark(run.name, run.advice);
     for (const std::string& warning : run.warnings) {
@@ -124,8 +121,7 @@ void AddRun(T_REPORT_WORK& work, const T_PUSH_RUN& run, T_DOC_CHAPTER& chapter)
 void FillPushesChapter(T_REPORT_WORK& work, T_DOC_CHAPTER& chapter)
 {
     if (work.Model().pushovers.empty()) return;
-    chapter.blocks.emplace_back(
-        DocTable(Say("IDS_QM_REPORT_SETUP"), SetupTable(work), work.limit));
+    chapter.blocks.emplace_back(DocTable(Say("IDS_QM_REPORT_SETUP"), SetupTable(work), work.limit));
     for (const std::string& fault : work.data.runFaults) {
         chapter.blocks.emplace_back(DocText(fault, DOC_TONE::Warning));
         work.Remark({}, fault);

@@ -42,8 +42,7 @@ std::vector<T_DOC_HEAD_ROW> HeadRows(const T_REPORT_WORK& work)
         {Say("IDS_QM_REPORT_CHECKER"), o.head.checker},
         {Say("IDS_QM_REPORT_DATE"), o.head.date},
         {Say("IDS_QM_REPORT_FILE"), o.fileName},
-        {Say("IDS_QM_REPORT_HASH"),
-         o.fileHash.empty() ? Say("IDS_QM_REPORT_NO_HASH") : o.fileHash},
+        {Say("IDS_QM_REPORT_HASH"), o.fileHash.empty() ? Say("IDS_QM_REPORT_NO_HASH") : o.fileHash},
         {Say("IDS_QM_REPORT_UNITS"), std::string(NameOf(styp.units.force)) + ", " +
                                          std::string(NameOf(styp.units.length)) + ", s"},
         {Say("IDS_QM_REPORT_PROGRAM"), ProductText()}};

@@ -2,9 +2,9 @@
 #pragma once
 
 #include "qm_db/dbdoc.h"
-#include "qm_db/records/reportrecord.h"
 #include "qm_rps/document/document.h"
 #include "qm_rps/document/reportdata.h"
+#include "qm_rps/document/reportrecord.h"
 
 #include <functional>
 

@@ -1,9 +1,9 @@
-#include "qm_ui/report/documentfile.h"
+#include "qm_ui/document/documentfile.h"
 
 #include "qm_rps/document/documenthtml.h"
-#include "qm_ui/report/documentpages.h"
-#include "qm_ui/report/documentpictures.h"
-#include "qm_ui/report/pdfoutline.h"
+#include "qm_ui/document/documentpages.h"
+#include "qm_ui/document/documentpictures.h"
+#include "qm_ui/document/pdfoutline.h"
 
 #include <QBuffer>
 #include <QCryptographicHash>

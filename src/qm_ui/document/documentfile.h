@@ -14,5 +14,5 @@ std::string FileHash(const std::string& path);
 [[nodiscard]] int WriteDocumentHtml(CDBDoc& doc, const T_DOCUMENT& document,
                                     const std::string& path, std::string& error);
 /// A4 pages with embedded fonts and bookmarks; the same document gives the same bytes.
-[[nodiscard]] int WriteDocumentPdf(CDBDoc& doc, const T_DOCUMENT& document,
-                                   const std::string& path, std::string& error);
+[[nodiscard]] int WriteDocumentPdf(CDBDoc& doc, const T_DOCUMENT& document, const std::string& path,
+                                   std::string& error);

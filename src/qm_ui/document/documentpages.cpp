@@ -1,6 +1,6 @@
-#include "qm_ui/report/documentpages.h"
+#include "qm_ui/document/documentpages.h"
 
-#include "qm_ui/report/pagetext.h"
+#include "qm_ui/document/pagetext.h"
 
 #include <QColor>
 #include <QPainter>
@@ -60,11 +60,12 @@ void CDocumentPages::Compose(std::vector<T_FLOW_PIECE> flow)
 {
     double y = kTextHeight + 1.0; // no page yet
     for (std::size_t i = 0; i < flow.size(); ++i) {
-        const bool fits = y + flow[i].above + std::min(HeightOfGroup(flow, i), kTextHeight) <=
-                          kTextHeight;
+        const bool fits =
+            y + flow[i].above + std::min(HeightOfGroup(flow, i), kTextHeight) <= kTextHeight;
         const bool isTop = !m_pages.empty() && m_pages.back().empty();
         constexpr double kEnough = 0.6; // of the page: a chapter may still begin
-        const bool wantsNew = flow[i].onNewPage || (flow[i].opensChapter && y > kEnough * kTextHeight) ||
+        const bool wantsNew = flow[i].onNewPage ||
+                              (flow[i].opensChapter && y > kEnough * kTextHeight) ||
                               (flow[i].opensChapter && m_pages.size() == 1);
         if (m_pages.empty() || ((wantsNew || !fits) && !isTop)) {
             m_pages.emplace_back();

@@ -1,7 +1,7 @@
 // A document cut into pages: for PDF files, printers and previews.
 #pragma once
 
-#include "qm_ui/report/pageflow.h"
+#include "qm_ui/document/pageflow.h"
 
 #include <QSizeF>
 

@@ -1,4 +1,4 @@
-#include "qm_ui/report/documentpictures.h"
+#include "qm_ui/document/documentpictures.h"
 
 #include "qm_ui/frame/framepainter.h"
 #include "qm_ui/hinge/hingeplot.h"

@@ -1,7 +1,7 @@
-#include "qm_ui/report/pageflow.h"
+#include "qm_ui/document/pageflow.h"
 
-#include "qm_ui/report/pagetext.h"
-#include "qm_ui/report/tableflow.h"
+#include "qm_ui/document/pagetext.h"
+#include "qm_ui/document/tableflow.h"
 
 #include <QColor>
 #include <QPainter>
@@ -44,9 +44,9 @@ public:
         const auto tone = static_cast<std::size_t>(t.tone);
         if (t.mono) return Mono(t.text);
         constexpr double kAbove = 6.0 * kPx;
-        m_out.push_back(TextPiece({QString::fromUtf8(signs[tone]) + Q(t.text), PageFont(kBodyPx),
-                                   m_width},
-                                  kAbove, colors[tone]));
+        m_out.push_back(
+            TextPiece({QString::fromUtf8(signs[tone]) + Q(t.text), PageFont(kBodyPx), m_width},
+                      kAbove, colors[tone]));
     }
     void operator()(const T_DOC_TABLE& t) { AddTable(t, m_width, m_out); }
     void operator()(const T_DOC_FACTS& t) { AddFacts(t, m_width, m_out); }
@@ -56,8 +56,8 @@ public:
         const auto drawing = std::make_shared<const T_DRAWING>(m_drawing(p));
         const QSizeF size = drawing->size;
         constexpr double kHighest = 0.55; // of the page
-        const double scale = std::min(p.width * m_width / size.width(),
-                                      kHighest * m_height / size.height());
+        const double scale =
+            std::min(p.width * m_width / size.width(), kHighest * m_height / size.height());
         constexpr double kAbove = 8.0 * kPx;
         T_FLOW_PIECE piece{kAbove, scale * size.height(), true};
         piece.draw = [drawing, scale, size](QPainter& painter, QPointF at) {
@@ -79,10 +79,9 @@ public:
         const std::string number = ChapterNumber(place);
         const std::size_t level = std::min(place.size(), kHeadingPx.size());
         constexpr double kAbove = 16.0 * kPx;
-        T_FLOW_PIECE piece =
-            TextPiece({Q(number + " " + chapter.title), PageFont(kHeadingPx[level - 1], true),
-                       m_width},
-                      kAbove, QColor(31, 78, 140));
+        T_FLOW_PIECE piece = TextPiece(
+            {Q(number + " " + chapter.title), PageFont(kHeadingPx[level - 1], true), m_width},
+            kAbove, QColor(31, 78, 140));
         piece.keepWithNext = true;
         piece.opensChapter = level == 1;
         piece.level = static_cast<int>(level);
@@ -141,9 +140,9 @@ private:
             std::max(kSmallestMonoPx, kMonoPx * std::min(1.0, m_width / std::max(natural, 1.0)));
         bool first = true;
         for (const QString& line : all.split(QLatin1Char('\n'))) {
-            m_out.push_back(TextPiece({line.isEmpty() ? QStringLiteral(" ") : line,
-                                       PageMonoFont(px), m_width},
-                                      first ? 6.0 * kPx : 0.0));
+            m_out.push_back(
+                TextPiece({line.isEmpty() ? QStringLiteral(" ") : line, PageMonoFont(px), m_width},
+                          first ? 6.0 * kPx : 0.0));
             first = false;
         }
     }

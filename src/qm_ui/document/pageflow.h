@@ -14,7 +14,7 @@ class QPainter;
 
 /// One piece that is never cut: a line of a table, a paragraph, a picture. Lengths: pagetext.h.
 struct T_FLOW_PIECE {
-    double above = 0.0;  // distance to the piece above it, not at the top of a page
+    double above = 0.0; // distance to the piece above it, not at the top of a page
     double height = 0.0;
     bool keepWithNext = false; // a heading, a caption, the head of a table
     bool onNewPage = false;

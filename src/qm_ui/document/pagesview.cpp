@@ -1,4 +1,4 @@
-#include "qm_ui/report/pagesview.h"
+#include "qm_ui/document/pagesview.h"
 
 #include <QKeyEvent>
 #include <QPainter>

@@ -1,7 +1,7 @@
 // The pages of a document below each other.
 #pragma once
 
-#include "qm_ui/report/documentpages.h"
+#include "qm_ui/document/documentpages.h"
 
 #include <QAbstractScrollArea>
 

@@ -1,4 +1,4 @@
-#include "qm_ui/report/pagetext.h"
+#include "qm_ui/document/pagetext.h"
 
 #include <QFontMetricsF>
 #include <QPainter>

@@ -1,4 +1,4 @@
-#include "qm_ui/report/pdfoutline.h"
+#include "qm_ui/document/pdfoutline.h"
 
 #define POINTERHOLDER_TRANSITION 4 // std::shared_ptr in its interface
 #include <qpdf/QPDF.hh>
@@ -27,7 +27,8 @@ std::vector<T_ENTRY> TreeOf(const std::vector<T_PAGE_MARK>& marks, std::size_t& 
 
 class COutlineMaker {
 public:
-    explicit COutlineMaker(QPDF& pdf) : m_pdf(pdf), m_pages(QPDFPageDocumentHelper(pdf).getAllPages())
+    explicit COutlineMaker(QPDF& pdf)
+        : m_pdf(pdf), m_pages(QPDFPageDocumentHelper(pdf).getAllPages())
     {
     }
 

@@ -1,7 +1,7 @@
 // What the writer of pages can't put into a PDF: bookmarks, and bytes that do not change.
 #pragma once
 
-#include "qm_ui/report/documentpages.h"
+#include "qm_ui/document/documentpages.h"
 
 #include <string>
 

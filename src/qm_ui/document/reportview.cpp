@@ -1,9 +1,9 @@
-#include "qm_ui/report/reportview.h"
+#include "qm_ui/document/reportview.h"
 
 #include "qm_rps/reportdlg.h"
-#include "qm_ui/report/documentfile.h"
-#include "qm_ui/report/documentpictures.h"
-#include "qm_ui/report/pagesview.h"
+#include "qm_ui/document/documentfile.h"
+#include "qm_ui/document/documentpictures.h"
+#include "qm_ui/document/pagesview.h"
 
 namespace {
 

@@ -1,7 +1,7 @@
-#include "qm_ui/report/tableflow.h"
+#include "qm_ui/document/tableflow.h"
 
 #include "qm_rps/generate/codehingerows.h"
-#include "qm_ui/report/pagetext.h"
+#include "qm_ui/document/pagetext.h"
 
 #include <QColor>
 #include <QPainter>
@@ -130,10 +130,9 @@ void AddRows(const T_TEXT_TABLE& table, const std::vector<DOC_TONE>& tones, doub
         }
         return cells;
     };
-    T_FLOW_PIECE head = RowPiece(
-        cellsOf([&](std::size_t c) { return Q(table.columns[c].head); }, PageFont(px, true),
-                Qt::black),
-        true);
+    T_FLOW_PIECE head = RowPiece(cellsOf([&](std::size_t c) { return Q(table.columns[c].head); },
+                                         PageFont(px, true), Qt::black),
+                                 true);
     head.keepWithNext = true;
     const auto kept = std::make_shared<const T_FLOW_PIECE>(head);
     out.push_back(std::move(head));
@@ -141,7 +140,8 @@ void AddRows(const T_TEXT_TABLE& table, const std::vector<DOC_TONE>& tones, doub
         const DOC_TONE tone = r < tones.size() ? tones[r] : DOC_TONE::Plain;
         out.push_back(RowPiece(cellsOf(
                                    [&](std::size_t c) {
-                                       return (c == 0 ? QString::fromUtf8(SignOf(tone)) : QString()) +
+                                       return (c == 0 ? QString::fromUtf8(SignOf(tone))
+                                                      : QString()) +
                                               Q(table.rows[r][c]);
                                    },
                                    PageFont(px), ColorOf(tone)),
@@ -202,8 +202,8 @@ void AddFacts(const T_DOC_FACTS& facts, double width, std::vector<T_FLOW_PIECE>&
 {
     AddCaption(facts.caption, width, out);
     // Lines of a code's trace have no definitions.
-    const bool defined = std::ranges::any_of(
-        facts.facts, [](const T_FACT& f) { return !f.definition.empty(); });
+    const bool defined =
+        std::ranges::any_of(facts.facts, [](const T_FACT& f) { return !f.definition.empty(); });
     const std::array shares = defined ? std::array{0.09, 0.26, 0.15, 0.31, 0.19}
                                       : std::array{0.18, 0.0, 0.18, 0.42, 0.22};
     for (const T_FACT& f : facts.facts) {
@@ -236,10 +236,10 @@ void AddPairs(const std::vector<T_DOC_HEAD_ROW>& rows, double width, double rowH
     constexpr double kNames = 0.3; // of the width
     constexpr double kTextPx = 11.0;
     for (const T_DOC_HEAD_ROW& row : rows) {
-        T_FLOW_PIECE piece = RowPiece(
-            {{{Q(row.name), PageFont(kTextPx), kNames * width - 2.0 * kPad}},
-             {{Q(row.value), PageFont(kTextPx), (1.0 - kNames) * width - 2.0 * kPad}}},
-            false);
+        T_FLOW_PIECE piece =
+            RowPiece({{{Q(row.name), PageFont(kTextPx), kNames * width - 2.0 * kPad}},
+                      {{Q(row.value), PageFont(kTextPx), (1.0 - kNames) * width - 2.0 * kPad}}},
+                     false);
         if (piece.height < rowHeight) {
             // The frame is drawn as high as the row.
             piece.draw = [row, width, rowHeight](QPainter& painter, QPointF at) {

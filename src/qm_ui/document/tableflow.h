@@ -1,7 +1,7 @@
 // Tables of documents as pieces of pages.
 #pragma once
 
-#include "qm_ui/report/pageflow.h"
+#include "qm_ui/document/pageflow.h"
 
 /// Columns as wide as their texts where they fit; else texts wrap, the font gets smaller, and what
 /// then is still too wide goes on in further tables with the first column repeated.

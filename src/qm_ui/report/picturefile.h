@@ -27,7 +27,7 @@ struct T_DRAWING {
 std::string SvgText(const T_DRAWING& drawing);
 
 /// Writes what `make` gives to a file, with a Qt application around it as above. 1 done; 0 error
-/// names the file: nothing was made, there is no memory, or the file can't be written; it is then as
-/// it was.
+/// names the file: nothing was made, there is no memory, or the file can't be written; it is then
+/// as it was.
 [[nodiscard]] int WriteOffscreen(const std::string& path, std::string& error,
                                  const std::function<std::string()>& make);

@@ -120,8 +120,8 @@ void AddInelastic(CFactList& list, const T_TARGET_DISP& t, const char* clause)
     list.Formula("qu", "IDS_QM_FACT_QU", *t.qu, "", clause, "Se(T*) / ay*",
                  N(t.Se) + " / " + N(t.ay));
     if (*t.qu <= 1.0)
-        return list.Formula("dt*", "IDS_QM_FACT_DT_STAR", t.dt, list.L(), clause,
-                            "det*  (qu <= 1)", N(*t.qu) + " <= 1");
+        return list.Formula("dt*", "IDS_QM_FACT_DT_STAR", t.dt, list.L(), clause, "det*  (qu <= 1)",
+                            N(*t.qu) + " <= 1");
     if (t.capped)
         return list.Formula("dt*", "IDS_QM_FACT_DT_STAR", t.dt, list.L(), clause, "3 det*",
                             "3 x " + N(t.det));

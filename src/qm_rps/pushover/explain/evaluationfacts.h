@@ -1,5 +1,5 @@
-// The numbers of an evaluation with their definitions, clauses and formulas with the numbers put in.
-// Reads the finished result, computes nothing but what the formulas say.
+// The numbers of an evaluation with their definitions, clauses and formulas with the numbers put
+// in. Reads the finished result, computes nothing but what the formulas say.
 #pragma once
 
 #include "qm_rps/pushover/explain/fact.h"

@@ -44,8 +44,7 @@ std::string Describe(const T_SPFC_EURO1996& s)
 
 std::string Describe(const T_SPFC_NTC& s)
 {
-    std::string text =
-        FormatText("soil %c, T%d, xi = ", s.soil, s.topography) + Percent(s.damping);
+    std::string text = FormatText("soil %c, T%d, xi = ", s.soil, s.topography) + Percent(s.damping);
     for (std::size_t i = 0; i < s.states.size(); ++i)
         if (const auto& state = s.states[i])
             text += std::string("; ") + kLimitStateNames[i] + ": ag = " + N(state->ag) +
@@ -81,9 +80,9 @@ std::string Behaviour(const T_EVAL_D& eval)
     const std::string key = keys.at(i);
     std::string text = key.starts_with("IDS") ? Say(key) : key;
     if (eval.method == PUSH_METHOD::Atc40 && eval.userDamping && i + 1 == keys.size())
-        text += ": beta1 = " + N((*eval.userDamping)[0]) + " %, kappa1 = " +
-                N((*eval.userDamping)[1]) + ", beta2 = " + N((*eval.userDamping)[2]) +
-                " %, kappa2 = " + N((*eval.userDamping)[3]);
+        text +=
+            ": beta1 = " + N((*eval.userDamping)[0]) + " %, kappa1 = " + N((*eval.userDamping)[1]) +
+            ", beta2 = " + N((*eval.userDamping)[2]) + " %, kappa2 = " + N((*eval.userDamping)[3]);
     return text;
 }
 
@@ -101,10 +100,9 @@ void AddPointInputs(const T_PUSH_EVALUATION& e, std::vector<T_FACT>& out)
 void AddTargetInputs(const T_PUSH_EVALUATION& e, std::vector<T_FACT>& out)
 {
     if (e.IsMasonry()) out.push_back(Input("IDS_QM_FACT_MASONRY", Say("IDS_QM_FACT_YES")));
-    out.push_back(
-        Input("IDS_QM_FACT_DRIFTS", Say(e.eval.driftKind.value_or(1) == 1
-                                            ? "IDS_QM_FACT_DRIFT_PAIRS"
-                                            : "IDS_QM_FACT_DRIFT_CENTRE")));
+    out.push_back(Input("IDS_QM_FACT_DRIFTS",
+                        Say(e.eval.driftKind.value_or(1) == 1 ? "IDS_QM_FACT_DRIFT_PAIRS"
+                                                              : "IDS_QM_FACT_DRIFT_CENTRE")));
 }
 
 } // namespace
@@ -121,17 +119,17 @@ std::vector<T_FACT> InputsOf(const T_PUSH_EVALUATION& e, const T_SPFC_D* spectru
                       kDirectionNames[static_cast<std::size_t>(e.loadCase.direction - 1)]));
     if (spectrum) {
         const std::string kind = kSpectrumKinds[spectrum->data.index()];
-        out.push_back(Input("IDS_QM_FACT_SPECTRUM",
-                            spectrum->name + " (" + kind + "): " +
-                                std::visit([](const auto& s) { return Describe(s); },
-                                           spectrum->data)));
+        out.push_back(Input(
+            "IDS_QM_FACT_SPECTRUM",
+            spectrum->name + " (" + kind +
+                "): " + std::visit([](const auto& s) { return Describe(s); }, spectrum->data)));
     }
     if (e.IsTarget())
         AddTargetInputs(e, out);
     else
         AddPointInputs(e, out);
-    out.push_back(Input("IDS_QM_FACT_FACTORS", Say(e.factors.eigenBased ? "IDS_QM_FACT_EIGEN"
-                                                                       : "IDS_QM_FACT_MASSES",
-                                                   std::to_string(e.factors.mode))));
+    out.push_back(Input("IDS_QM_FACT_FACTORS",
+                        Say(e.factors.eigenBased ? "IDS_QM_FACT_EIGEN" : "IDS_QM_FACT_MASSES",
+                            std::to_string(e.factors.mode))));
     return out;
 }

@@ -14,8 +14,8 @@ struct T_FACT {
     std::string formula;    // "2 pi sqrt(m* dy* / Fy*)"; empty: an input
     std::string numbers;    // "2 pi sqrt(123.4 0.0123 / 345.6)"; empty: none
     std::optional<double> value{};
-    std::string unit;       // empty: none
-    std::string text;       // stands for a value that is no number
+    std::string unit; // empty: none
+    std::string text; // stands for a value that is no number
     CODE_MARK mark = CODE_MARK::Computed;
 
     /// "0.52341 s".
