@@ -209,11 +209,27 @@ void CheckRotation(const T_CHECKING& c)
     PlasticRotations(c, ofGravity ? c.with.gravity->N : c.state.N);
 }
 
+/// The rows of beams hold without axial force: up to 0.25 Npl the moment need not be reduced (EN
+/// 1993-1-1 6.2.9.1(4)), beyond 0.1 Pye ASCE 41-17 9.4.2.4.2 takes beams for columns (recalled).
+void LeaveOutPressedBeam(const T_CHECKING& c)
+{
+    const T_MEMBER_END& m = c.end.member;
+    const double yield =
+        m.material.mean && m.material.mean->fy > 0.0 ? m.material.mean->fy : m.material.Fy;
+    const double most = IsChordCode(c.end.By()) ? 0.25 : 0.1;
+    const double ratio = std::fabs(c.state.N) / (m.section.area * yield);
+    if (m.kind != MEMBER_KIND::Beam || !(ratio > most)) return;
+    T_MODE_CHECK& check = c.Of(Rotation);
+    check.at = {};
+    check.why = Say("IDS_QM_JUDGE_BEAM_AXIAL", CodeNumber(ratio), CodeNumber(most));
+}
+
 } // namespace
 
 void CheckSteel(const T_CHECKING& c)
 {
     CheckRotation(c);
+    LeaveOutPressedBeam(c);
     (void)CheckShear(c);
     if (c.end.member.aboutY && BucklesSideways(c.end.member.section))
         c.out.warnings.push_back({kNoSidewaysKey, {}});
