@@ -1,6 +1,7 @@
 // What the tools of the desktop share: the document, its window and the views of dialogs.
 #pragma once
 
+#include "qm_rps/desk/selection.h"
 #include "qm_rps/mainframe.h"
 #include "qm_ui/form/dialogview.h"
 
@@ -14,6 +15,7 @@ struct T_DESKTOP {
     const CViewFactory& factory;
     CDialogView& view;             // over the main window
     QWidget* window;               // the main window
+    CSelection& selection;         // of every pane
     std::function<void()> changed; // to be called after a tool may have changed the document
 };
 

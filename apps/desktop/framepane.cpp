@@ -43,10 +43,11 @@ const char* KindKey(S::KIND kind)
 
 } // namespace
 
-CFramePane::CFramePane(CDBDoc& doc, CFrameScene& scene, QWidget* parent)
-    : QWidget(parent), m_scene(scene), m_hinges(doc), m_view(new CFrameView(this)),
-      m_source(new QComboBox(this)), m_slider(new QSlider(Qt::Horizontal, this)),
-      m_step(new QLabel(this)), m_scaleLabel(new QLabel(this)), m_sourceLabel(new QLabel(this)),
+CFramePane::CFramePane(CDBDoc& doc, CFrameScene& scene, CSelection& selection, QWidget* parent)
+    : QWidget(parent), m_scene(scene), m_selection(selection), m_hinges(doc),
+      m_view(new CFrameView(this)), m_source(new QComboBox(this)),
+      m_slider(new QSlider(Qt::Horizontal, this)), m_step(new QLabel(this)),
+      m_scaleLabel(new QLabel(this)), m_sourceLabel(new QLabel(this)),
       m_scaleEdit(new QLineEdit(this))
 {
     m_scaleEdit->setMaximumWidth(90);
@@ -68,8 +69,30 @@ CFramePane::CFramePane(CDBDoc& doc, CFrameScene& scene, QWidget* parent)
     connect(m_source, &QComboBox::currentIndexChanged, this, [this] { ShowSource(); });
     connect(m_slider, &QSlider::valueChanged, this, [this] { ShowStep(); });
     connect(m_scaleEdit, &QLineEdit::editingFinished, this, [this] { TakeScale(); });
+    m_view->m_onLine = [this](std::size_t line) { Choose({line}); };
+    m_view->m_onLines = [this](const std::vector<std::size_t>& lines) { Choose(lines); };
+    m_selection.Watch(this, [this] { MarkChosen(); });
     Retranslate();
     Refresh();
+}
+
+CFramePane::~CFramePane()
+{
+    m_selection.Unwatch(this);
+}
+
+/// Elements that are clicked or lie in a box take the place of those chosen before.
+void CFramePane::Choose(const std::vector<std::size_t>& lines)
+{
+    CSelection::T_KEYS ids;
+    for (const std::size_t line : lines)
+        ids.insert(m_view->Picture().scene->lines.at(line).id);
+    m_selection.Choose(EXPLORER_TABLE::Elements, std::move(ids));
+}
+
+void CFramePane::MarkChosen()
+{
+    ShowStep();
 }
 
 QString CFramePane::NameOf(const S& source) const
@@ -167,6 +190,10 @@ void CFramePane::ShowStep()
         picture.note =
             MMSGFunction::Format("IDS_QM_UI_SHAPE_NOTE", {scale, picture.scene->lengthUnit});
     picture.scale = m_scale;
+    const CSelection::T_KEYS& chosen = m_selection.Chosen(EXPLORER_TABLE::Elements);
+    if (!chosen.empty())
+        for (const T_SCENE_LINE& line : picture.scene->lines)
+            picture.chosen.push_back(chosen.contains(line.id));
     picture.drifts = m_scene.Drifts(source, step);
     picture.marks = m_hinges.Marks(source, step, *picture.scene);
     m_step->setText(source.steps > 0 ? QStringLiteral("%1 / %2").arg(step).arg(source.steps)

@@ -1,6 +1,7 @@
 // The frame view with its controls: what it is shown under, the step, the scale, what is drawn.
 #pragma once
 
+#include "qm_rps/desk/selection.h"
 #include "qm_ui/frame/frameview.h"
 #include "qm_ui/report/picturefile.h"
 
@@ -13,8 +14,9 @@ class QSlider;
 
 class CFramePane : public QWidget {
 public:
-    /// Document and scene must outlive the pane.
-    CFramePane(CDBDoc& doc, CFrameScene& scene, QWidget* parent = nullptr);
+    /// Document, scene and selection must outlive the pane.
+    CFramePane(CDBDoc& doc, CFrameScene& scene, CSelection& selection, QWidget* parent = nullptr);
+    ~CFramePane() override;
 
     /// The document has changed: frame, sources and shape again; the choice stays where it can.
     void Refresh();
@@ -35,8 +37,11 @@ private:
     void ShowSource();
     void ShowStep();
     void TakeScale();
+    void Choose(const std::vector<std::size_t>& lines);
+    void MarkChosen();
 
     CFrameScene& m_scene;
+    CSelection& m_selection;
     CShownHinges m_hinges;
     std::vector<T_SHAPE_SOURCE> m_sources;
     std::vector<std::array<double, 3>> m_moves;

@@ -41,7 +41,7 @@ QString Text(const char* key)
 } // namespace
 
 CMainWindow::CMainWindow()
-    : m_desktop{m_doc, m_frame, m_factory, m_view, this, [this] { Refresh(); }}
+    : m_desktop{m_doc, m_frame, m_factory, m_view, this, m_selection, [this] { Refresh(); }}
 {
     RegisterViews(m_factory);
     m_frame.SetView(&m_view);
@@ -78,7 +78,7 @@ CMainWindow::~CMainWindow()
 
 void CMainWindow::MakePanes()
 {
-    m_framePane = new CFramePane(m_doc, m_scene, this);
+    m_framePane = new CFramePane(m_doc, m_scene, m_selection, this);
     setCentralWidget(m_framePane);
     m_explorer = new CExplorerPane(
         m_doc, m_view, [this] { Refresh(); }, this);
@@ -171,6 +171,7 @@ void CMainWindow::UpdateActions()
 
 void CMainWindow::Refresh()
 {
+    m_selection.KeepExisting(m_doc);
     m_explorer->Refresh();
     m_framePane->Refresh();
     const T_UNITS units = m_doc.Unit().Units();

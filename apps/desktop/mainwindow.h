@@ -64,6 +64,7 @@ private:
     CDialogView m_view{m_factory, this};
     T_DESKTOP m_desktop;
     CFrameScene m_scene{m_doc};
+    CSelection m_selection;
 
     QElapsedTimer m_clock;
     CFramePane* m_framePane = nullptr;

@@ -31,7 +31,7 @@ void Prepare(T_DESKTOP& desktop, CReportDlg& dialog)
             // What is made is not known beforehand: the bar comes nearer to its end with each part.
             return work([&](const std::string&) {
                 ++done;
-                return tell(done, done + kChapterNames.size());
+                return tell(done, done + kReportChapterNames.size());
             });
         });
     };

@@ -25,6 +25,14 @@ struct T_DESIGN_CODES {
     bool operator==(const T_DESIGN_CODES&) const = default;
 };
 
+/// What the title block of a report says, which chapters it has, and how long its tables are.
+struct T_REPORT_D {
+    std::string project, author, checker, date;
+    std::vector<std::string> chapters; // their names (kReportChapterNames); empty: all
+    int rows = 200;                    // of a table at most; 0: all
+    bool operator==(const T_REPORT_D&) const = default;
+};
+
 /// Plane of a plane model; the displacements out of it are restrained at every node.
 enum class MODEL_PLANE { XY, XZ, YZ };
 
@@ -42,6 +50,7 @@ struct T_STYP_D {
     std::array<double, 2> defaultAlpha1{}, defaultAlpha2{};
     std::optional<MODEL_PLANE> plane{}; // absent: a space model
     T_STCT_D stageControl{};
+    T_REPORT_D report{};
     bool operator==(const T_STYP_D&) const = default;
 };
 

@@ -10,7 +10,7 @@ public:
     explicit CReportDlg(CDBDoc& doc) : m_doc(doc) { m_chosen.fill(true); }
 
     T_REPORT_D m_head; // its chapters are m_chosen
-    std::array<bool, kChapterNames.size()> m_chosen{};
+    std::array<bool, kReportChapterNames.size()> m_chosen{};
     int m_rows = 200; // of a table at most; 0: all
     std::string m_fileHash;
 
@@ -45,7 +45,7 @@ private:
     CDBDoc& m_doc;
     T_DOCUMENT m_document;
     T_REPORT_D m_madeHead;
-    std::array<bool, kChapterNames.size()> m_madeChosen{};
+    std::array<bool, kReportChapterNames.size()> m_madeChosen{};
     int m_madeRows = 0;
     long m_madeRevision = -1;
     int m_times = 0;

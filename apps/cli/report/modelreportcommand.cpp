@@ -29,7 +29,7 @@ int Parse(const T_MODEL_REPORT_OPTIONS& o, T_REPORT_OPTIONS& out)
     const auto chapters = ChaptersNamed(o.only, unknown);
     if (!chapters) {
         std::string all;
-        for (const char* const name : kChapterNames)
+        for (const char* const name : kReportChapterNames)
             all += (all.empty() ? "" : ", ") + std::string(name);
         Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_REPORT_CHAPTER", unknown, all));
         return 0;

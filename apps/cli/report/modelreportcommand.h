@@ -2,7 +2,7 @@
 #pragma once
 
 #include "exitcodes.h"
-#include "qm_rps/document/reportrecord.h"
+#include "qm_db/records.h"
 
 #include <string>
 

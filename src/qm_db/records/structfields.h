@@ -41,6 +41,22 @@ void CaseFields(V& v, T_FIELD_REF<V, T_STCT_D> r)
     v.Opt("cable_sag", r.cableSag, false);
 }
 
+template <class V>
+void CaseFields(V& v, T_FIELD_REF<V, T_REPORT_D> r)
+{
+    v.Opt("project", r.project, {});
+    v.Opt("author", r.author, {});
+    v.Opt("checker", r.checker, {});
+    v.Opt("date", r.date, {});
+    v.Texts("chapters", r.chapters);
+    v.CheckEach(
+        "chapters", r.chapters,
+        [](const std::string& name) { return std::ranges::count(kReportChapterNames, name) > 0; },
+        "IDS_QM_CASE_REPORT_CHAPTER");
+    v.Opt("rows", r.rows, 200);
+    v.Check("rows", r.rows >= 0, kNotNegative);
+}
+
 /// What a case file begins with.
 template <class V>
 void HeadFields(V& v, T_FIELD_REF<V, T_STYP_D> r)
@@ -67,6 +83,7 @@ void OptionFields(V& v, T_FIELD_REF<V, T_STYP_D> r)
         options.Padded("default_alpha1", r.defaultAlpha1, kDimNone);
         options.Padded("default_alpha2", r.defaultAlpha2, kDimNone);
     });
+    v.Group("report", [&](auto& report) { CaseFields(report, r.report); });
 }
 
 template <class V>

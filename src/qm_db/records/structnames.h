@@ -31,3 +31,8 @@ inline constexpr std::array<const char*, 2> kStageStepNames{"first", "last"};
 
 inline constexpr std::array<const char*, 3> kObjectiveNames{"linear", "square", "min-max"};
 inline constexpr std::array<const char*, 3> kSignNames{"negative", "free", "positive"};
+
+/// Chapters of a report in their order.
+inline constexpr std::array<const char*, 10> kReportChapterNames{
+    "model",       "loads",     "modes",   "hinges", "pushes",
+    "evaluations", "judgement", "factors", "stages", "remarks"};

@@ -63,5 +63,6 @@ enum class EXPLORER_TABLE {
 const char* TitleKey(EXPLORER_TABLE table);
 /// Number of its records.
 std::size_t RecordCount(const CDBDoc& doc, EXPLORER_TABLE table);
+bool RecordExists(const CDBDoc& doc, EXPLORER_TABLE table, int key);
 /// The document must outlive the grid.
 std::unique_ptr<CRecordGrid> MakeRecordGrid(CDBDoc& doc, EXPLORER_TABLE table);

@@ -14,7 +14,7 @@ struct T_CHAPTER_ROW {
     void (*fill)(T_REPORT_WORK&, T_DOC_CHAPTER&);
 };
 /// By REPORT_CHAPTER.
-constexpr std::array<T_CHAPTER_ROW, kChapterNames.size()> kChapters{
+constexpr std::array<T_CHAPTER_ROW, kReportChapterNames.size()> kChapters{
     {{"IDS_QM_REPORT_MODEL", FillModelChapter},
      {"IDS_QM_REPORT_LOADS", FillLoadsChapter},
      {"IDS_QM_REPORT_MODES", FillModesChapter},
@@ -87,12 +87,12 @@ std::optional<std::vector<REPORT_CHAPTER>> ChaptersNamed(const std::string& list
         const std::size_t to = std::min(list.find(',', from), list.size());
         std::string name = list.substr(from, to - from);
         std::erase(name, ' ');
-        const auto at = std::ranges::find(kChapterNames, name);
-        if (at == kChapterNames.end()) {
+        const auto at = std::ranges::find(kReportChapterNames, name);
+        if (at == kReportChapterNames.end()) {
             unknown = name;
             return std::nullopt;
         }
-        out.push_back(static_cast<REPORT_CHAPTER>(at - kChapterNames.begin()));
+        out.push_back(static_cast<REPORT_CHAPTER>(at - kReportChapterNames.begin()));
         from = to + 1;
     }
     std::ranges::sort(out);
@@ -110,9 +110,9 @@ std::vector<REPORT_CHAPTER> ChosenChapters(const T_REPORT_OPTIONS& options)
 {
     if (!options.only.empty()) return options.only;
     std::vector<REPORT_CHAPTER> all;
-    for (std::size_t i = 0; i < kChapterNames.size(); ++i)
+    for (std::size_t i = 0; i < kReportChapterNames.size(); ++i)
         if (options.head.chapters.empty() ||
-            std::ranges::count(options.head.chapters, kChapterNames[i]) > 0)
+            std::ranges::count(options.head.chapters, kReportChapterNames[i]) > 0)
             all.push_back(static_cast<REPORT_CHAPTER>(i));
     return all;
 }

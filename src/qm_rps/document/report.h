@@ -2,13 +2,13 @@
 #pragma once
 
 #include "qm_db/dbdoc.h"
+#include "qm_db/recordfacts.h"
 #include "qm_rps/document/document.h"
 #include "qm_rps/document/reportdata.h"
-#include "qm_rps/document/reportrecord.h"
 
 #include <functional>
 
-/// Chapters in their order.
+/// Chapters by kReportChapterNames.
 enum class REPORT_CHAPTER {
     Model,
     Loads,
@@ -21,9 +21,6 @@ enum class REPORT_CHAPTER {
     Stages,
     Remarks
 };
-inline constexpr std::array<const char*, 10> kChapterNames{
-    "model",       "loads",     "modes",   "hinges", "pushes",
-    "evaluations", "judgement", "factors", "stages", "remarks"};
 /// Key of a chapter's title.
 const char* ChapterKey(REPORT_CHAPTER chapter);
 

@@ -43,7 +43,8 @@ void AddHead(CFormView& form, DLG& d)
     form.EndGroup();
     form.Group(KeyText("IDS_QM_UI_REPORT_CHAPTERS"));
     for (std::size_t i = 0; i < d.m_chosen.size(); ++i)
-        form.Flag([i] { return DLG::ChapterText(i); }, Ref(d.m_chosen[i])).name = kChapterNames[i];
+        form.Flag([i] { return DLG::ChapterText(i); }, Ref(d.m_chosen[i])).name =
+            kReportChapterNames[i];
     form.Integer(KeyText("IDS_QM_UI_REPORT_ROWS"), Ref(d.m_rows)).name = "rows";
     form.EndGroup();
 }
