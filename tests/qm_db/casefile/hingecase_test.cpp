@@ -145,6 +145,7 @@ TEST(HingeCase, ATextWithOlderKeysHoldsTheSameModel)
 {
     T_MODEL_CONTENT now = ParseGood(RichText());
     now.model.styp.defaultAlpha1 = now.model.styp.defaultAlpha2 = {};
+    now.model.styp.report = {};
     for (auto& [key, type] : now.model.hingeTypes) {
         type.fibreSection = type.thicknessSection = 0;
         if (type.pmm) type.pmm->negative.reset(), type.pmm->balanced = false;
