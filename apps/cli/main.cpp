@@ -59,6 +59,7 @@ int RunCommand(int argc, char** argv)
     AddJudge(app, code);
     AddUlf(app, code);
     AddReport(app, code);
+    AddDocuments(app, code);
     try {
         app.parse(argc, argv);
     } catch (const CLI::ParseError& e) {

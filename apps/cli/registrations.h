@@ -33,3 +33,5 @@ void AddPushSetup(CLI::App& push, EXIT_CODE& code);
 void AddCaseGenerate(CLI::App& cases, EXIT_CODE& code);
 void AddJudge(CLI::App& app, EXIT_CODE& code);
 void AddReport(CLI::App& app, EXIT_CODE& code);
+/// "help": of a command by its name, manual pages, completion of shells. After all others.
+void AddDocuments(CLI::App& app, EXIT_CODE& code);
