@@ -94,24 +94,4 @@ TEST_F(Documents, EveryCommandOfThePagesWorks)
     }
 }
 
-TEST_F(Documents, EveryLinkToAFileLeadsToOne)
-{
-    std::vector<fs::path> pages{ProjectFolder() / "README.md", ProjectFolder() / "CONTRIBUTING.md",
-                                ProjectFolder() / "examples/README.md"};
-    for (const auto& entry : fs::directory_iterator(ProjectFolder() / "docs"))
-        if (entry.is_regular_file()) pages.push_back(entry.path());
-    std::size_t count = 0;
-    for (const fs::path& page : pages) {
-        const std::string text = ReadText(page);
-        for (auto at = text.find("]("); at != std::string::npos; at = text.find("](", at + 1)) {
-            std::string target = text.substr(at + 2, text.find(')', at) - at - 2);
-            target = target.substr(0, target.find('#'));
-            if (target.empty() || target.find("://") != std::string::npos) continue;
-            EXPECT_TRUE(fs::exists(page.parent_path() / target)) << page << ": " << target;
-            ++count;
-        }
-    }
-    EXPECT_GE(count, 10U);
-}
-
 } // namespace
