@@ -1,7 +1,6 @@
 #include "qm_rps/pushovercurveedit.h"
 
 #include "qm_base/msgfunction.h"
-#include "qm_db/editscope.h"
 #include "qm_db/recordfacts.h"
 #include "qm_rps/desk/recordnames.h"
 #include "qm_rps/evaluatedsteps.h"
@@ -38,12 +37,18 @@ std::vector<std::string> CPushOverCurveEdit::Evaluations() const
 
 int CPushOverCurveEdit::OnOpen(const std::string& evaluation)
 {
-    for (const auto& [key, record] : m_doc.Data().Model().evaluations) {
-        if (record.name != evaluation || !m_doc.Attr().GetEval(key, m_settings)) continue;
-        Update();
-        return 1;
-    }
-    return 0;
+    if (!m_doc.Attr().GetEval(KeyOf(evaluation), m_settings)) return 0;
+    m_opened = evaluation;
+    m_stored = m_settings;
+    Update();
+    return 1;
+}
+
+void CPushOverCurveEdit::OnOpenTurned(const T_EVAL_D& evaluation)
+{
+    m_settings = m_stored = evaluation;
+    m_opened = evaluation.name;
+    Update();
 }
 
 void CPushOverCurveEdit::OnNew()
@@ -58,7 +63,8 @@ void CPushOverCurveEdit::OnNew()
     fresh.name = base;
     for (int i = 2; Contains(taken, fresh.name); ++i)
         fresh.name = base + " " + std::to_string(i);
-    m_settings = fresh;
+    m_settings = m_stored = fresh;
+    m_opened.clear();
     Update();
 }
 
@@ -117,6 +123,7 @@ int CPushOverCurveEdit::OnDocumentChanged()
         Start();
         return 1;
     }
+    ReadAgain();
     Update();
     return 1;
 }
@@ -166,32 +173,6 @@ int CPushOverCurveEdit::SayRefusal()
 {
     ShowMessage(m_driver.Refusal().messageKey, m_driver.Refusal().text);
     return 0;
-}
-
-int CPushOverCurveEdit::OnStore()
-{
-    if (!Update()) {
-        ShowMessage("IDS_QM_UI_PUSH_NOT_STORED",
-                    MMSGFunction::Format("IDS_QM_UI_PUSH_NOT_STORED", {m_shown.Refused()}));
-        return 0;
-    }
-    if (m_settings.name.empty()) return Say("IDS_QM_UI_PUSH_NO_NAME");
-    const auto& table = m_doc.Data().Model().evaluations;
-    int key = NextKey(table);
-    for (const auto& [other, record] : table) {
-        if (record.name != m_settings.name) continue;
-        if (record == m_settings) return 1;
-        if (!AskYesNo("IDS_QM_UI_PUSH_REPLACE",
-                      MMSGFunction::Format("IDS_QM_UI_PUSH_REPLACE", {record.name})))
-            return 0;
-        key = other;
-        break;
-    }
-    CEditScope edit(m_doc, MMSGFunction::GetValue("IDS_QM_UI_TABLE_EVALUATIONS"));
-    if (!edit.Put(key, m_settings) || !edit.Commit()) return Say("IDS_QM_UI_EDIT_BUSY");
-    Update();
-    if (m_changed) m_changed();
-    return 1;
 }
 
 int CPushOverCurveEdit::OnStoreSteps()

@@ -1,8 +1,8 @@
 // Model behind the pushover curve window: the evaluation being edited and what it gives. Every
 // change is evaluated at once. The fields stand on the pages, the result and its picture in Shown.
 //
-// The document changes only by OnStore and OnStoreSteps. Settings that can't be evaluated leave the
-// last picture and values, with the reason.
+// The document changes only by OnStore, OnKeep and OnStoreSteps. Settings that can't be evaluated
+// leave the last picture and values, with the reason.
 #pragma once
 
 #include "qm_rps/push/pushrun.h"
@@ -44,6 +44,13 @@ public:
     // ---- operations; each evaluates again ----
     /// The settings of a stored evaluation. 0 there is none of that name.
     [[nodiscard]] int OnOpen(const std::string& evaluation);
+    /// The settings of one direction of a load case that is pushed in several, as EvaluationsOf
+    /// gives them; they are stored under another name only.
+    void OnOpenTurned(const T_EVAL_D& evaluation);
+    /// Name of the stored evaluation that is edited; empty: none, it is a new one.
+    const std::string& Opened() const { return m_opened; }
+    /// Whether the settings differ from what is stored, or from those of a new evaluation.
+    bool HasUnsaved() const;
     /// Defaults, for the same load case and spectrum.
     void OnNew();
     /// Evaluates the settings. 1 the result is of these settings; 0 they are refused (Findings,
@@ -61,6 +68,9 @@ public:
     /// Keeps the settings in the document under their name, as one edit; asks before it replaces
     /// another evaluation. 0 with a message: no name, settings refused, the person said no.
     [[nodiscard]] int OnStore();
+    /// Keeps what was changed of the opened evaluation, as one edit. 1 kept; 0 nothing was changed,
+    /// the settings are refused, or bear another name (that is for OnStore).
+    int OnKeep();
     /// Stores the limit-state steps of the result for the load case. 0 with a message: there are
     /// none to store.
     [[nodiscard]] int OnStoreSteps();
@@ -102,22 +112,32 @@ public:
     /// Called after the document was changed from here.
     std::function<void()> m_changed;
 
-private:
+protected:
+    /// The first stored evaluation, else a new one.
     void Start();
+    /// Of the stored evaluation with this name; 0: there is none.
+    int KeyOf(const std::string& name) const;
+    void Pushing(const PUSHING_FN& pushing) const;
+
+    CDBDoc& m_doc;
+
+private:
+    int Put(int key);
+    void ReadAgain();
     int Evaluate(bool storeSteps);
     void ListAgain();
     int Say(const char* key);
     int SayRefusal();
-    void Pushing(const PUSHING_FN& pushing) const;
     /// A window at the points of the result, which `fill` pushes to. 0 with a message why not.
     template <class DIALOG, class FILL>
     int ShowAtPoints(FILL fill);
     void ShowText(const char* titleKey, std::string text);
 
-    CDBDoc& m_doc;
     CPushOverCurveDlg m_driver;
     CShownEvaluation m_shown;
     SPECTRUM_SHOW m_evaluatedShow = SPECTRUM_SHOW::Displacement;
+    std::string m_opened;
+    T_EVAL_D m_stored;    // of the opened evaluation, or as a new one began
     T_EVAL_D m_evaluated; // settings of the latest evaluation, refused ones too
     std::vector<T_FINDING> m_findings;
     std::vector<int> m_steps;

@@ -24,15 +24,6 @@ constexpr std::array<T_METHOD_ROW, 8> kMethods{{
 }};
 // clang-format on
 
-/// Sa of a curve at Sd, its first ordinate counted from the origin; empty beyond its end.
-std::optional<double> AccelOn(const T_ADRS_CURVE& curve, double Sd)
-{
-    if (curve.Sd.empty() || Sd > *std::ranges::max_element(curve.Sd)) return std::nullopt;
-    const double first = curve.Sd.front();
-    if (Sd < first) return curve.Sa.front() * Sd / first;
-    return CurveAccelAt(curve.View(), Sd);
-}
-
 T_COMPARISON_ROW RowOf(const T_METHOD_ROW& method, const T_PUSH_EVALUATION& e,
                        const CPushEvaluator& evaluator)
 {
@@ -49,7 +40,7 @@ T_COMPARISON_ROW RowOf(const T_METHOD_ROW& method, const T_PUSH_EVALUATION& e,
     for (const T_LIMIT_ROW& state : e.limitStates) {
         if (!method.state || state.name != method.state || !state.demand) continue;
         const double Sd = e.factors.gamma != 0.0 ? *state.demand / e.factors.gamma : 0.0;
-        const std::optional<double> Sa = AccelOn(e.capacity, Sd);
+        const std::optional<double> Sa = CapacityAt(e.capacity, Sd);
         if (!Sa) continue; // beyond the push: no force belongs to it
         row.found = true;
         row.D = *state.demand;
@@ -74,6 +65,14 @@ void CalcSpread(T_PUSH_COMPARISON& c)
 }
 
 } // namespace
+
+std::optional<double> CapacityAt(const T_ADRS_CURVE& curve, double Sd)
+{
+    if (curve.Sd.empty() || Sd > *std::ranges::max_element(curve.Sd)) return std::nullopt;
+    const double first = curve.Sd.front();
+    if (Sd < first) return curve.Sa.front() * Sd / first;
+    return CurveAccelAt(curve.View(), Sd);
+}
 
 std::vector<std::string> RemarksOf(const T_PUSH_COMPARISON& comparison)
 {

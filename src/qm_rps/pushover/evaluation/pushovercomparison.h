@@ -18,6 +18,10 @@ struct T_PUSH_COMPARISON {
     double minD = 0.0, maxD = 0.0, meanD = 0.0; // over those rows
 };
 
+/// Sa of a capacity spectrum at Sd, its first ordinate counted from the origin; empty beyond its
+/// end.
+std::optional<double> CapacityAt(const T_ADRS_CURVE& curve, double Sd);
+
 /// The messages of all results, each text once, in their order.
 std::vector<std::string> RemarksOf(const T_PUSH_COMPARISON& comparison);
 

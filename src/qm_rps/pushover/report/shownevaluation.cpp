@@ -23,6 +23,7 @@ bool HasPicture(const T_PUSH_EVALUATION& e)
 
 void CShownEvaluation::Take(const T_PUSH_EVALUATION& result)
 {
+    ++m_turn;
     m_result = result;
     m_refused.clear();
     m_noPicture.clear();

@@ -9,9 +9,19 @@ public:
     /// A new result. Without a curve to draw the picture stays the one before.
     void Take(const T_PUSH_EVALUATION& result);
     /// Nothing is on show.
-    void Clear() { m_result = m_pictured = {}; }
+    void Clear()
+    {
+        m_result = m_pictured = {};
+        ++m_turn;
+    }
     /// The settings are refused for this reason; result and picture stay.
-    void Refuse(const std::string& reason) { m_refused = reason; }
+    void Refuse(const std::string& reason)
+    {
+        m_refused = reason;
+        ++m_turn;
+    }
+    /// Another number when something else is on show.
+    long Turn() const { return m_turn; }
 
     /// Latest result; its values and messages.
     const T_PUSH_EVALUATION& Result() const { return m_result; }
@@ -35,4 +45,5 @@ private:
     std::string m_refused;   // the settings
     std::string m_noPicture; // of the result
     int m_trial = 0;
+    long m_turn = 0;
 };
