@@ -14,7 +14,10 @@
 #include "qm_rps/pushovertextdlg.h"
 #include "qm_rps/rps_main.h"
 #include "qm_rps/rpsmanager.h"
+#include "qm_ui/evaluate/evaluationdeskview.h"
 #include "qm_ui/pushover/pushovercurveview.h"
+
+#include <QTabWidget>
 
 #include <numeric>
 
@@ -34,7 +37,26 @@ T_WINDOW_EXAMPLE CurveExample(const char* name, const char* evaluation, int tria
                 window->Model().Shown().SetTrial(trial);
                 window->Form().Refresh();
                 window->show();
-                window->resize(1280, 860);
+                window->resize(1320, 900);
+                return window;
+            }};
+}
+
+/// The window with two evaluations overlaid; `page`: the field whose page is in front.
+T_WINDOW_EXAMPLE OverlayExample(const char* name, const char* page)
+{
+    return {name, "rc-frame-3-storey", [=](CMainWindow& main) -> std::unique_ptr<QWidget> {
+                auto window = CPushOverWindow::Make(main.Desktop(), nullptr);
+                for (const int row : {1, 3, 5, 7})
+                    window->Model().OnTick(row, true);
+                window->Form().Refresh();
+                QWidget* const shown = window->Form().Find(page)->widget;
+                for (QWidget* at = shown; at; at = at->parentWidget())
+                    if (QWidget* stack = at->parentWidget())
+                        if (auto* tabs = qobject_cast<QTabWidget*>(stack->parentWidget()))
+                            tabs->setCurrentWidget(at);
+                window->show();
+                window->resize(1320, 900);
                 return window;
             }};
 }
@@ -84,8 +106,12 @@ T_VIEW ShowsOnly(int width, int height)
 
 void RegisterPushoverViews(CViewFactory& factory)
 {
-    factory.Register<CPushOverCurveEdit>(KeyText("IDS_QM_UI_PUSH_TITLE"), BuildPushOverCurve,
-                                         ShowsOnly(1280, 860));
+    T_VIEW desk = ShowsOnly(1320, 900);
+    desk.closes = [](zql::frx::MDialog& model) {
+        return dynamic_cast<CEvaluationDeskDlg&>(model).OnClose() != 0;
+    };
+    factory.Register<CEvaluationDeskDlg>(KeyText("IDS_QM_UI_PUSH_TITLE"), BuildEvaluationDesk,
+                                         desk);
     factory.Register<CPushOverCurveDampParamUser>(KeyText("IDS_QM_UI_PUSH_USER_TITLE"),
                                                   BuildUserDamping);
     factory.Register<CPushOverControlDlg>(KeyText("IDS_QM_UI_PUSH_CONTROL_TITLE"),
@@ -104,7 +130,7 @@ T_COMMANDS PushoverCommands(T_DESKTOP& desktop)
     const auto hasCase = [&desktop] { return !desktop.doc.Data().Model().pushovers.empty(); };
     const auto fresh = [&desktop] {
         CPushOverWindow& window = CPushOverWindow::Show(desktop);
-        window.Model().OnNew();
+        window.Model().OnFresh();
         window.Form().Refresh();
     };
     const auto compare = [&desktop] {
@@ -124,8 +150,11 @@ T_COMMANDS PushoverCommands(T_DESKTOP& desktop)
         T_POLC_D polc;
         if (key == 0 || !desktop.doc.Attr().GetPolc(key, polc)) return;
         CPushOverWindow& window = CPushOverWindow::Show(desktop);
-        window.Model().m_settings.push = polc.name;
-        window.Model().OnEdited();
+        window.Model().OnFresh(); // stored evaluations stay with their load cases
+        if (window.Model().Opened().empty()) {
+            window.Model().m_settings.push = polc.name;
+            window.Model().OnEdited();
+        }
         window.Form().Refresh();
     };
     return {{kMenu, "IDS_QM_UI_PUSH_CURVE", "F7", [&desktop] { CPushOverWindow::Show(desktop); },
@@ -182,6 +211,8 @@ std::vector<T_WINDOW_EXAMPLE> PushoverWindowExamples()
             CurveExample("pushover-fema440", "PX_MODE1 FEMA440 C", 0),
             CurveExample("pushover-ec8", "PX_MODE1 EC8", 0),
             CurveExample("pushover-ntc", "PX_MODE1 NTC2018", 0),
+            OverlayExample("pushover-overlay", "plot"),
+            OverlayExample("pushover-bars", "barsPlot"),
             DialogExample<CPushOverComparisonDlg>("pushover-comparison", {1000, 880}, comparison),
             DialogExample<CPushOverControlDlg>("pushover-control", {560, 420}, control),
             DialogExample<CPushOverAdditionalStepDlg>("pushover-steps", {480, 420}, steps),

@@ -1,4 +1,4 @@
-// Views of the pushover curve window and its dialogs.
+// Views of the dialogs of the evaluation window.
 #pragma once
 
 #include "qm_ui/form/viewfactory.h"
@@ -7,11 +7,8 @@ class CPushOverAdditionalStepDlg;
 class CPushOverComparisonDlg;
 class CPushOverControlDlg;
 class CPushOverCurveDampParamUser;
-class CPushOverCurveEdit;
 class CPushOverTextDlg;
 
-/// The window: settings left, picture, trials, results and commands right.
-void BuildPushOverCurve(CFormView& form, CPushOverCurveEdit& model);
 void BuildPushOverControl(CFormView& form, CPushOverControlDlg& model);
 void BuildAdditionalSteps(CFormView& form, CPushOverAdditionalStepDlg& model);
 void BuildUserDamping(CFormView& form, CPushOverCurveDampParamUser& model);
