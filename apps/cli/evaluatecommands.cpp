@@ -1,5 +1,6 @@
 #include "evaluatecommands.h"
 
+#include "evaluate/overviewoutput.h"
 #include "inputfile.h"
 #include "output.h"
 #include "push/pushfirst.h"
@@ -76,21 +77,35 @@ std::string ReadFault(CDBDoc& doc, const std::string& push)
     return name->turn != 0 || it == results.end() ? std::string() : it->second->Error();
 }
 
-/// What was asked for.
+/// The first name that no evaluation has; empty: each has one.
+std::string UnknownName(CDBDoc& doc, const T_EVALUATE_OPTIONS& o)
+{
+    const auto unknown = std::ranges::find_if(
+        o.only, [&doc](const std::string& name) { return EvaluationsOf(doc, name).empty(); });
+    return unknown == o.only.end() ? std::string() : *unknown;
+}
+
+/// What was asked for, in the order of the names; nothing where one of them is unknown.
 std::vector<T_EVAL_D> AskedFor(CDBDoc& doc, const T_EVALUATE_OPTIONS& o)
 {
-    std::vector<T_EVAL_D> all = EvaluationsOf(doc, o.only);
+    if (!UnknownName(doc, o).empty()) return {};
+    std::vector<T_EVAL_D> all;
+    for (const std::string& name : o.only) {
+        const std::vector<T_EVAL_D> named = EvaluationsOf(doc, name);
+        all.insert(all.end(), named.begin(), named.end());
+    }
+    if (o.only.empty()) all = EvaluationsOf(doc);
     std::erase_if(all, [&](const T_EVAL_D& eval) {
         return !o.push.empty() && eval.push != o.push && !IsTurnOf(eval.push, o.push);
     });
     return all;
 }
 
-EXIT_CODE NothingAsked(const CDBDoc& doc, const T_EVALUATE_OPTIONS& o)
+EXIT_CODE NothingAsked(CDBDoc& doc, const T_EVALUATE_OPTIONS& o)
 {
-    if (!o.only.empty())
+    if (const std::string unknown = UnknownName(doc, o); !unknown.empty())
         return Complain(EXIT_CODE::Usage,
-                        doc.Path() + ": " + Say("IDS_QM_CLI_NO_EVALUATION", o.only));
+                        doc.Path() + ": " + Say("IDS_QM_CLI_NO_EVALUATION", unknown));
     if (!o.push.empty())
         return Complain(EXIT_CODE::Usage,
                         doc.Path() + ": " + Say("IDS_QM_CLI_NO_EVALUATION_OF", o.push));
@@ -140,6 +155,8 @@ std::vector<T_OUTPUT> OutputsOf(const T_EVALUATE_OPTIONS& o, std::size_t count)
     for (const std::string& plot : {o.plot, o.plotDemand})
         for (std::size_t i = 0; i < count && !plot.empty(); ++i)
             outputs.push_back({NumberedPath(plot, i, count), OUTPUT_KIND::Picture});
+    for (const T_OUTPUT& output : OverviewOutputs(o))
+        outputs.push_back(output);
     return outputs;
 }
 
@@ -258,7 +275,7 @@ EXIT_CODE RunCompare(const T_COMPARE_OPTIONS& o)
 
 EXIT_CODE RunEvaluate(const T_EVALUATE_OPTIONS& o)
 {
-    for (const std::string& plot : {o.plot, o.plotDemand})
+    for (const std::string& plot : {o.plot, o.plotDemand, o.overlay, o.bars})
         if (const EXIT_CODE code = CheckPlotName(plot); code != EXIT_CODE::Done) return code;
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
@@ -274,7 +291,8 @@ EXIT_CODE RunEvaluate(const T_EVALUATE_OPTIONS& o)
     const std::vector<T_HINGES_AT> hinges = HingesAtPoints(doc, results);
     if (const EXIT_CODE code = WriteResults(doc, o, results, hinges); code != EXIT_CODE::Done)
         return code;
-    if (o.json != "-") PrintTables(results, hinges);
+    if (const EXIT_CODE code = WriteOverview(doc, o, results); code != EXIT_CODE::Done) return code;
+    if (o.json != "-" && o.summary != "-") PrintTables(results, hinges);
     if (o.trace && o.json != "-") {
         for (const T_PUSH_EVALUATION& e : results)
             std::printf("%s", TraceTable(e).c_str());

@@ -8,7 +8,7 @@
 
 struct T_EVALUATE_OPTIONS {
     std::string file;
-    std::string only;                 // name of one evaluation; empty: all
+    std::vector<std::string> only;    // names of evaluations; empty: all
     std::string push;                 // name of their push or one direction of it; empty: all
     std::string json;                 // file, or "-" for standard output
     std::string report;               // text report
@@ -16,6 +16,11 @@ struct T_EVALUATE_OPTIONS {
     std::string curve;                // curve table alone
     std::string plot;                 // .svg, .png or .pdf
     std::string plotDemand;           // the demand spectrum over periods
+    std::string overlay;              // all of them in one picture
+    bool whole = false;               // of which the whole curves, not the region of their points
+    std::string bars;                 // picture of one figure of each
+    std::string barsOf = "D";         // of kCardNames
+    std::string summary;              // the figures of each and its verdict: .csv, or "-"
     std::vector<int> steps;           // additional steps to list
     std::vector<std::string> spectra; // additional spectra for performance points
     bool trace = false;

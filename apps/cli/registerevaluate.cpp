@@ -1,6 +1,7 @@
 // The arguments of the commands on pushover evaluations.
 #include "evaluatecommands.h"
 #include "qm_rps/judge/judgement.h"
+#include "qm_rps/pushover/overview/evaluationcards.h"
 #include "registershared.h"
 #include "registrations.h"
 #include "verifycommand.h"
@@ -12,7 +13,7 @@ void AddEvaluate(CLI::App& app, EXIT_CODE& code)
     auto* sub = app.add_subcommand("evaluate", Say("IDS_QM_HELP_EVALUATE"));
     auto o = std::make_shared<T_EVALUATE_OPTIONS>();
     AddFile(sub, o->file);
-    sub->add_option("--only", o->only, Say("IDS_QM_HELP_EVALUATE_ONLY"));
+    sub->add_option("--only", o->only, Say("IDS_QM_HELP_EVALUATE_ONLY"))->allow_extra_args(false);
     sub->add_option("--push", o->push, Say("IDS_QM_HELP_EVALUATE_PUSH"));
     AddJson(sub, o->json);
     auto* const report = sub->add_option("--report", o->report, Say("IDS_QM_HELP_EVALUATE_REPORT"));
@@ -22,6 +23,15 @@ void AddEvaluate(CLI::App& app, EXIT_CODE& code)
     sub->add_option("--curve", o->curve, Say("IDS_QM_HELP_EVALUATE_CURVE"));
     sub->add_option("--plot", o->plot, Say("IDS_QM_HELP_EVALUATE_PLOT"));
     sub->add_option("--plot-demand", o->plotDemand, Say("IDS_QM_HELP_EVALUATE_DEMAND"));
+    auto* const overlay =
+        sub->add_option("--overlay", o->overlay, Say("IDS_QM_HELP_EVALUATE_OVERLAY"));
+    sub->add_flag("--whole-curve", o->whole, Say("IDS_QM_HELP_EVALUATE_WHOLE"))->needs(overlay);
+    auto* const bars = sub->add_option("--bars", o->bars, Say("IDS_QM_HELP_EVALUATE_BARS"));
+    sub->add_option("--bars-of", o->barsOf, Say("IDS_QM_HELP_EVALUATE_BARS_OF"))
+        ->check(CLI::IsMember(std::vector<std::string>(kCardNames.begin(), kCardNames.end())))
+        ->capture_default_str()
+        ->needs(bars);
+    sub->add_option("--summary", o->summary, Say("IDS_QM_HELP_EVALUATE_SUMMARY"));
     sub->add_option("--add-step", o->steps, Say("IDS_QM_HELP_EVALUATE_STEP"));
     sub->add_option("--add-spectrum", o->spectra, Say("IDS_QM_HELP_EVALUATE_SPECTRUM"));
     sub->add_flag("--trace", o->trace, Say("IDS_QM_HELP_EVALUATE_TRACE"));
