@@ -50,6 +50,8 @@ int RunCommand(int argc, char** argv)
     app.add_option("--lang", language, Say("IDS_QM_HELP_LANG"))->check(CLI::IsMember({"en", "it"}));
     app.require_subcommand(1);
     AddModel(app, code);
+    AddNew(app, code);
+    AddParts(app, code);
     AddEvaluations(app, code);
     AddHingeCommands(app, code);
     AddSection(app, code);

@@ -19,6 +19,8 @@ std::string ParserWords(const std::string& what);
 /// empty: all are known, or none is near.
 std::string MeantWord(const CLI::App& program, std::span<const char* const> words);
 void AddModel(CLI::App& app, EXIT_CODE& code);
+void AddNew(CLI::App& app, EXIT_CODE& code);
+void AddParts(CLI::App& app, EXIT_CODE& code);
 void AddEvaluations(CLI::App& app, EXIT_CODE& code);
 void AddHingeCommands(CLI::App& app, EXIT_CODE& code);
 void AddSection(CLI::App& app, EXIT_CODE& code);

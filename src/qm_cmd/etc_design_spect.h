@@ -71,6 +71,8 @@ public:
     virtual double CalcSaAt(double T) const;
     /// End of the constant-acceleration range, s.
     virtual double CornerPeriod() const { return m_shape.TC; }
+    /// Of a code spectrum, at its own damping; of a table only TC.
+    const T_SPECT_SHAPE& Shape() const { return m_shape; }
     /// Gravity that the spectrum itself states, m/s2 in SI; absent for code spectra.
     virtual std::optional<double> GravitySi() const { return std::nullopt; }
 

@@ -85,7 +85,8 @@ void NoteSigns(const T_RECORDER_LINE& row, T_SIGNS& signs)
 std::optional<T_RECORDER_FORM> Refuse(const T_RECORDER_FAULT& at, const char* key,
                                       T_RECORDER_FAULT& fault)
 {
-    fault = {at.line, at.column, Say(key, QuotedText(at.reason))};
+    fault = {at.line, at.column, Say(key, QuotedText(at.reason)),
+             std::string_view(key) == "IDS_QM_RECORDER_EITHER"};
     return std::nullopt;
 }
 

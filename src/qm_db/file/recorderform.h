@@ -27,6 +27,7 @@ struct T_RECORDER_FAULT {
     int line = 0;
     std::size_t column = 0;
     std::string reason;
+    bool isEither = false; // a comma may be a decimal one or part two numbers
 };
 
 /// True for a row in which no cell looks like a number, whatever the form of the table.

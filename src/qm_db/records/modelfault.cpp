@@ -5,6 +5,7 @@
 #include "qm_db/records/inputlimits.h"
 #include "qm_db/records/pushfields.h"
 #include "qm_db/records/stagefields.h"
+#include "qm_db/spectrumrules.h"
 
 #include <algorithm>
 #include <cmath>
@@ -317,6 +318,11 @@ std::vector<T_FINDING> RecordFindings(const T_MODEL& model, const T_SECT_D& reco
 std::vector<T_FINDING> RecordFindings(const T_MODEL& model, const T_MATL_D& record, int key)
 {
     return FindingsOf(model.materials, record, key);
+}
+
+std::vector<T_FINDING> RecordFindings(const T_MODEL& model, const T_SPFC_D& record, int key)
+{
+    return FindingsOf(model.spectra, record, key);
 }
 
 std::string ModelFault(const T_MODEL& model)
