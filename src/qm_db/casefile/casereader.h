@@ -24,6 +24,8 @@ void ReadSteps(CJsonReader& in, const CCaseNames& names, const T_CASE_FOLDER& fo
 /// Rules of the control of the pushover analysis; of a load case when all of them have been read.
 void JudgePushControl(CJsonReader& in, const T_POGC_D& control);
 void JudgePush(CJsonReader& in, const T_MODEL& model, const T_POLC_D& push);
+/// The control node and what the pattern names.
+void JudgePushNames(CJsonReader& in, const T_MODEL& model, const T_POLC_D& push);
 /// References by name, and rules of the record.
 void JudgeEvaluation(CJsonReader& in, const T_MODEL& model, const T_EVAL_D& eval);
 

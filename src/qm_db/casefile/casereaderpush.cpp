@@ -67,12 +67,17 @@ void JudgePush(CJsonReader& in, const T_MODEL& model, const T_POLC_D& push)
         Judge(stops, key, LoadCaseFault(push, model, key));
 }
 
+void JudgePushNames(CJsonReader& in, const T_MODEL& model, const T_POLC_D& push)
+{
+    in.Check("control_node", model.nodes.contains(push.controlNode), "IDS_QM_CASE_NO_NODE");
+    CheckPattern(in.Member("pattern"), model, push);
+}
+
 void ReadSteps(CJsonReader& in, const CCaseNames& names, const T_CASE_FOLDER& folder, int key,
                T_POLC_D& push, T_MODEL_CONTENT& content)
 {
     T_MODEL& model = content.model;
-    in.Check("control_node", model.nodes.contains(push.controlNode), "IDS_QM_CASE_NO_NODE");
-    CheckPattern(in.Member("pattern"), model, push);
+    JudgePushNames(in, model, push);
     if (push.control && in.Has("steps") && in.Member("steps").IsNumber()) {
         if (push.steps) in.FailAt("steps", "IDS_QM_CASE_SAME_AS", kIncrementsKey);
         in.Get("steps", push.steps);
