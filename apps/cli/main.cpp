@@ -52,6 +52,7 @@ int RunCommand(int argc, char** argv)
     AddModel(app, code);
     AddNew(app, code);
     AddParts(app, code);
+    AddRecord(app, code);
     AddEvaluations(app, code);
     AddHingeCommands(app, code);
     AddSection(app, code);

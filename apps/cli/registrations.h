@@ -37,3 +37,4 @@ void AddJudge(CLI::App& app, EXIT_CODE& code);
 void AddReport(CLI::App& app, EXIT_CODE& code);
 /// "help": of a command by its name, manual pages, completion of shells. After all others.
 void AddDocuments(CLI::App& app, EXIT_CODE& code);
+void AddRecord(CLI::App& app, EXIT_CODE& code);
