@@ -79,6 +79,7 @@ void CFrameScene::Build()
     const T_MODEL& model = m_doc.Data().Model();
     m_scene = {};
     m_stages.clear();
+    m_shownOf = nullptr;
     m_scene.title = model.styp.title;
     m_scene.lengthUnit = NameOf(m_doc.Unit().Units().length);
     std::map<int, std::size_t> at;
@@ -97,7 +98,12 @@ void CFrameScene::Build()
         if (e.kind == ELEM_KIND::Spring || !at.contains(e.nodeI) || !at.contains(e.nodeJ)) continue;
         const auto ends = hinged.find(id);
         const T_ENDS<bool> has = ends == hinged.end() ? T_ENDS<bool>{} : ends->second;
-        m_scene.lines.push_back({id, at[e.nodeI], at[e.nodeJ], e.kind, has.I, has.J});
+        T_SCENE_LINE line{id, at[e.nodeI], at[e.nodeJ], e.kind, has.I, has.J};
+        for (std::size_t d = 0; d < 3; ++d) {
+            line.offsetI[d] = m_doc.Unit().ConvertUnitLengthOut(e.offset.I[d]);
+            line.offsetJ[d] = m_doc.Unit().ConvertUnitLengthOut(e.offset.J[d]);
+        }
+        m_scene.lines.push_back(line);
     }
     m_revision = m_scene.revision = m_doc.Data().Revision();
     m_pushover = 0;
@@ -127,6 +133,46 @@ const T_FRAME_SCENE& CFrameScene::SceneOf(const T_SHAPE_SOURCE& source)
     return stage;
 }
 
+const T_FRAME_SCENE& CFrameScene::Shown(const T_SHAPE_SOURCE& source, const std::set<int>& hidden)
+{
+    const T_FRAME_SCENE& of = SceneOf(source);
+    if (hidden.empty()) return of;
+    if (m_shownOf == &of && m_hidden == hidden) return m_shown;
+    m_shown = of;
+    m_shownOf = &of;
+    m_hidden = hidden;
+    m_shown.variant = ++m_variant;
+    std::erase_if(m_shown.lines,
+                  [&](const T_SCENE_LINE& line) { return hidden.contains(line.id); });
+    std::vector<char> hides(m_shown.nodes.size(), 0), shows(hides);
+    for (const T_SCENE_LINE& line : of.lines)
+        hides[line.i] = hides[line.j] = 1;
+    for (const T_SCENE_LINE& line : m_shown.lines)
+        shows[line.i] = shows[line.j] = 1;
+    for (std::size_t n = 0; n < shows.size(); ++n)
+        m_shown.nodes[n].shown = shows[n] || !hides[n];
+    return m_shown;
+}
+
+/// Load cases, then combinations: those have results that all their cases have.
+void CFrameScene::AddStatic(std::vector<T_SHAPE_SOURCE>& sources)
+{
+    std::set<int> analysed;
+    for (const auto& [key, load] : m_doc.Data().Model().loadCases) {
+        const bool has = m_doc.Post().CheckStaticResult(key) != 0;
+        if (has) analysed.insert(key);
+        sources.push_back({S::KIND::Static, key, load.name, 0, 0, has});
+    }
+    for (const auto& [key, combination] : m_doc.Data().Model().combinations) {
+        T_LCOM_D flat;
+        const bool has = m_doc.Attr().NormalizeLcom(combination, flat) != 0 &&
+                         std::ranges::all_of(flat.items, [&](const T_LCOM_ITEM& item) {
+                             return analysed.contains(item.key);
+                         });
+        sources.push_back({S::KIND::Combination, key, combination.name, 0, 0, has});
+    }
+}
+
 /// Every load case that has steps, and every direction of its static angle that has.
 void CFrameScene::AddPushes(std::vector<T_SHAPE_SOURCE>& sources)
 {
@@ -149,13 +195,11 @@ void CFrameScene::AddPushes(std::vector<T_SHAPE_SOURCE>& sources)
 std::vector<T_SHAPE_SOURCE> CFrameScene::Sources()
 {
     const T_MODEL& model = m_doc.Data().Model();
-    CPostCtrl& post = m_doc.Post();
     std::vector<S> sources{{}};
-    for (const auto& [key, load] : model.loadCases)
-        if (post.CheckStaticResult(key)) sources.push_back({S::KIND::Static, key, load.name, 0});
-    if (!model.stages.empty() && post.CheckStagedResult())
-        for (const auto& [key, stage] : model.stages)
-            sources.push_back({S::KIND::Stage, key, stage.name, stage.steps});
+    AddStatic(sources);
+    const bool staged = !model.stages.empty() && m_doc.Post().CheckStagedResult();
+    for (const auto& [key, stage] : model.stages)
+        sources.push_back({S::KIND::Stage, key, stage.name, stage.steps, 0, staged});
     AddPushes(sources);
     for (const auto& entry : model.modes)
         sources.push_back({S::KIND::Mode, entry.first, std::to_string(entry.first), 0});
@@ -244,6 +288,9 @@ int CFrameScene::Read(const T_SHAPE_SOURCE& source, int step, T_MOVES& out)
     switch (source.kind) {
     case S::KIND::Static:
         if (!post.SelectLoadCombNew(CPostCtrl::MakeLoadComb(source.key))) return 0;
+        return ReadNodes([&](int node, T_DOF6& v) { return post.GetDispNew(node, v); }, out);
+    case S::KIND::Combination:
+        if (!post.SelectLoadCombNew(source.key)) return 0;
         return ReadNodes([&](int node, T_DOF6& v) { return post.GetDispNew(node, v); }, out);
     case S::KIND::Stage:
         post.SelectStage(source.key, step, kStageLoadSum);

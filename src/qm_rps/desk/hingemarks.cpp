@@ -20,6 +20,7 @@ T_HINGE_MARKS PlaceHinges(const T_PUSH_RUN& run, const T_FRAME_SCENE& scene, con
         if (mark.line < 0 && record != model.elements.end()) {
             const auto node = nodes.find(record->second.nodeI);
             if (node != nodes.end()) mark.node = node->second;
+            mark.shown = record->second.kind == ELEM_KIND::Spring;
         }
         for (const PUSH_STATE state : run.hinges[i].state)
             out.occurs[static_cast<std::size_t>(state)] = true;
@@ -47,6 +48,10 @@ const T_HINGE_MARKS* CShownHinges::Marks(const T_SHAPE_SOURCE& source, int step,
         m_run = {};
         std::string why; // said where the results are read; here they are left out
         if (!CPushRun(m_doc).Read(source.key, source.turn, m_run, why)) m_run = {};
+        m_variant = -1;
+    }
+    if (m_variant != scene.variant) {
+        m_variant = scene.variant;
         m_marks = PlaceHinges(m_run, scene, m_doc.Data().Model());
     }
     if (m_marks.hinges.empty() || step < 1 || step > std::ssize(m_run.loadFactor)) return nullptr;

@@ -11,6 +11,7 @@ struct T_HINGE_MARK {
     double at = 0.0;      // fraction of the line, from I
     PUSH_STATE state = PUSH_STATE::Elastic;
     bool chosen = false;
+    bool shown = true; // false: its element is hidden, or does not stand
 };
 
 struct T_HINGE_MARKS {
@@ -33,11 +34,13 @@ public:
     /// The states of a step, from 1; valid until the next call. Null: the source is no push of our
     /// own, or its results are older than the model, which then does not know the states.
     const T_HINGE_MARKS* Marks(const T_SHAPE_SOURCE& source, int step, const T_FRAME_SCENE& scene);
+    /// The run whose states were given last.
+    const T_PUSH_RUN& Run() const { return m_run; }
 
 private:
     CDBDoc& m_doc;
     // What was read last.
-    long m_revision = -1;
+    long m_revision = -1, m_variant = 0;
     int m_key = 0, m_turn = 0;
     T_PUSH_RUN m_run;
     T_HINGE_MARKS m_marks;

@@ -1,0 +1,103 @@
+#include "qm_rps/view/stress.h"
+
+#include "qm_db/sectionproperties.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace {
+
+/// A section with its fibres: half widths from the centroid along y (both sides) and z.
+struct T_FIBRES {
+    double area = 0.0, Iyy = 0.0, Izz = 0.0;
+    double left = 0.0, right = 0.0, half = 0.0; // along -y, +y, z
+    bool round = false, bends = true;
+};
+
+std::optional<T_FIBRES> FibresOf(const T_SECT_D& record, bool bends)
+{
+    T_SECT_D s;
+    SECT_FAULT fault{};
+    if (!CSectionProperties::Calc(record, s, fault) || !(s.area > 0.0)) return {};
+    T_FIBRES f{s.area, s.Iyy, s.Izz, 0.0, 0.0, 0.0, false, bends};
+    if (!bends) return f;
+    switch (s.shape) {
+    case SECT_SHAPE::Value:
+        return {};
+    case SECT_SHAPE::Circle:
+    case SECT_SHAPE::Pipe:
+        f.round = true;
+        f.half = f.left = f.right = 0.5 * s.size[0];
+        break;
+    case SECT_SHAPE::Channel:
+        f.left = ChannelProperties(s).centroid;
+        f.right = s.size[1] - f.left;
+        f.half = 0.5 * s.size[0];
+        break;
+    default:
+        f.half = 0.5 * s.size[0];
+        f.left = f.right = 0.5 * s.size[1];
+    }
+    return f;
+}
+
+/// The stress with the largest magnitude, with its sign.
+double Extreme(const T_FIBRES& f, double N, double My, double Mz)
+{
+    const double axial = N / f.area;
+    if (!f.bends) return axial;
+    if (f.round) {
+        const double bending = std::hypot(My, Mz) * f.half / f.Iyy;
+        return axial < 0.0 ? axial - bending : axial + bending;
+    }
+    double worst = axial;
+    for (const double z : {-f.half, f.half})
+        for (const double y : {-f.left, f.right}) {
+            const double at = axial + My * z / f.Iyy - Mz * y / f.Izz;
+            if (std::fabs(at) > std::fabs(worst)) worst = at;
+        }
+    return worst;
+}
+
+} // namespace
+
+T_STRESS_PICTURE StressesOf(const CViewFrame& frame, const T_MODEL& model,
+                            const T_FRAME_SCENE& scene, const T_VIEW_RESULTS& results,
+                            const solver::T_LOAD_CASE& loads, const T_UNITS& units)
+{
+    T_STRESS_PICTURE out;
+    out.unit = std::string(NameOf(units.force)) + "/" + std::string(NameOf(units.length)) + "2";
+    if (results.force.size() != scene.lines.size()) return out;
+    const auto lineLoads = frame.LineLoads(loads);
+    std::map<std::pair<int, bool>, std::optional<T_FIBRES>> fibres;
+    for (std::size_t l = 0; l < scene.lines.size(); ++l) {
+        const T_SCENE_LINE& line = scene.lines[l];
+        const long at = frame.ElementAt(line.id);
+        if (at < 0 || line.kind == ELEM_KIND::Link) continue;
+        const auto e = static_cast<std::size_t>(at);
+        if (!frame.Axes(e)) continue;
+        const bool beam = line.kind == ELEM_KIND::Beam;
+        const int section = model.elements.at(line.id).section;
+        const auto [known, isNew] = fibres.try_emplace({section, beam});
+        if (isNew) known->second = FibresOf(model.sections.at(section), beam);
+        T_LINE_STRESS& shown = out.lines.emplace_back();
+        shown.line = l;
+        if (!known->second) {
+            ++out.unchecked;
+            continue;
+        }
+        const double length = frame.Axes(e)->length;
+        CMemberLine member(length, results.force[l][0],
+                           beam ? std::span<const T_LINE_LOAD>(lineLoads[e])
+                                : std::span<const T_LINE_LOAD>());
+        (void)member.FitTo(results.force[l]);
+        for (std::size_t p = 0; p < kStressPlaces; ++p) {
+            const double x = length * static_cast<double>(p) / (kStressPlaces - 1);
+            const double value =
+                Extreme(*known->second, member.Force(0, x), member.Force(4, x), member.Force(5, x));
+            shown.value.push_back(FromSi(value, units, kDimStress));
+            out.largest = std::max(out.largest, std::fabs(shown.value.back()));
+        }
+    }
+    return out;
+}
