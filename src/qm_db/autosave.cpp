@@ -98,7 +98,7 @@ void CAutosave::Follow(const std::string& file)
 AUTOSAVE CAutosave::Tick(double nowS, T_FILE_ERROR& error)
 {
     const CDataCtrl& data = m_doc.Data();
-    if (!m_started) m_dueS = nowS + kIntervalS;
+    if (!m_started) m_dueS = nowS + m_intervalS;
     m_started = true;
     const bool changed = data.IsModified() && data.Revision() != m_revision;
     if (m_file.empty() || nowS < m_dueS || !changed || m_doc.IsExcuted()) return AUTOSAVE::Nothing;
@@ -107,7 +107,7 @@ AUTOSAVE CAutosave::Tick(double nowS, T_FILE_ERROR& error)
     const CLOCK::time_point begin = CLOCK::now();
     const int done = Write(error);
     const double tookS = std::chrono::duration<double>(CLOCK::now() - begin).count();
-    m_dueS = nowS + std::max(kIntervalS, kTimesWriting * tookS);
+    m_dueS = nowS + std::max(m_intervalS, kTimesWriting * tookS);
     if (done) m_revision = data.Revision();
     return done ? AUTOSAVE::Written : AUTOSAVE::Failed;
 }

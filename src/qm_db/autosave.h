@@ -35,13 +35,15 @@ public:
     CAutosave(const CAutosave&) = delete;
     CAutosave& operator=(const CAutosave&) = delete;
 
+    /// Least time between two copies, s; kIntervalS until then.
+    void SetInterval(double seconds) { m_intervalS = seconds; }
     /// Copies go beside this file from now on; numbers go on after those that are there. The
     /// copies of the file before stay as they are: Remove comes first where they are not wanted.
     void Follow(const std::string& file);
     const std::string& File() const { return m_file; }
 
     /// Writes a copy where the document has unsaved changes that the latest copy lacks, at most
-    /// every 20 s and so that writing takes a twentieth of the time at most. nowS: a clock that
+    /// every interval and so that writing takes a twentieth of the time at most. nowS: a clock that
     /// does not go back, s. Failed: error says why, the copies are as they were; it is tried again
     /// after the interval.
     AUTOSAVE Tick(double nowS, T_FILE_ERROR& error);
@@ -67,6 +69,7 @@ private:
     long m_next = 1;
     long m_revision = -1; // of the document in the latest copy
     double m_dueS = 0.0;
+    double m_intervalS = kIntervalS;
     bool m_started = false;                                     // the first tick has set the clock
     std::string m_session;                                      // of this object
     std::map<std::string, std::unique_ptr<CModelLock>> m_taken; // copies of an ended session

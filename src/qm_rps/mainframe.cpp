@@ -2,6 +2,7 @@
 
 #include "qm_base/messagehistory.h"
 #include "qm_base/msgfunction.h"
+#include "qm_db/casefile.h"
 #include "qm_db/filectrl.h"
 #include "qm_db/sectionproperties.h"
 
@@ -148,8 +149,25 @@ bool CMainFrame::MayReplace()
 int CMainFrame::OnNew()
 {
     if (!MayReplace()) return 0;
+    T_MODEL_CONTENT content;
+    content.model.styp.units = m_newUnits;
     m_doc.NewModel();
+    m_doc.Data().Assign(std::move(content));
     m_readOnly = false;
+    FollowDocument();
+    return 1;
+}
+
+int CMainFrame::OnOpenCopy(const std::string& path)
+{
+    T_MODEL_CONTENT content;
+    T_FILE_ERROR error;
+    if (!CCaseFile::Read(path, content, error)) return Refuse(error.text);
+    if (!MayReplace()) return 0;
+    m_doc.NewModel();
+    m_doc.Data().Assign(std::move(content));
+    m_readOnly = false;
+    Note("IDS_QM_UI_OPENED_COPY", path);
     FollowDocument();
     return 1;
 }

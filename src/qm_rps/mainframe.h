@@ -23,6 +23,8 @@ public:
     /// A model file, or a case file, which is saved as a model file later. A model file that is
     /// open elsewhere or may not be written is opened for reading, if the person wants that.
     [[nodiscard]] int OnOpen(const std::string& path);
+    /// A case file as a model of its own without a path: the file itself is never written.
+    [[nodiscard]] int OnOpenCopy(const std::string& path);
     /// To SavePath; 0 also where that is empty (the caller asks for a name).
     [[nodiscard]] int OnSave();
     /// A path without extension gets that of a model file; ".json" writes a case file.
@@ -43,6 +45,11 @@ public:
 
     /// Every load case, the construction stages, and the eigen modes that are asked for.
     [[nodiscard]] int OnAnalyse(int modes, std::function<bool(std::size_t, std::size_t)> progress);
+
+    /// Least time between two copies for the case of a crash, s.
+    void SetAutosaveInterval(double seconds) { m_autosave.SetInterval(seconds); }
+    /// Units of a model that OnNew makes.
+    T_UNITS m_newUnits{};
 
     /// Asks for the name of a file to save to; empty: cancelled.
     std::function<std::string()> m_askPath;
