@@ -146,7 +146,9 @@ void CDialogWindow::PutBeside()
 
 void CDialogWindow::showEvent(QShowEvent* event)
 {
-    resize(WantedSize());
-    if (m_view.placement == PLACEMENT::Beside) PutBeside();
+    if (!property(kPlacedProperty).toBool()) {
+        resize(WantedSize());
+        if (m_view.placement == PLACEMENT::Beside) PutBeside();
+    }
     QDialog::showEvent(event);
 }

@@ -8,6 +8,9 @@
 class QDialogButtonBox;
 class QScrollArea;
 
+/// The property of a window that was given its place before it came up.
+inline constexpr const char* kPlacedProperty = "placed";
+
 /// Accepting gives what was typed to the model and asks its OnOK; where that refuses, the window
 /// stays open with the first marked field in focus. A screen that is too small scrolls the form.
 class CDialogWindow : public QDialog {
@@ -18,6 +21,7 @@ public:
     ~CDialogWindow() override;
 
     CFormView& Form() { return *m_form; }
+    const zql::frx::MDialog& Model() const { return m_model; }
     void accept() override;
     void reject() override;
 

@@ -1,5 +1,7 @@
 #include "qm_ui/form/formfield.h"
 
+#include "qm_ui/form/formletters.h"
+
 #include <QLabel>
 #include <QStyle>
 #include <QVariant>
@@ -36,7 +38,7 @@ void CFormField::ShowState()
     const bool on = !shown || shown();
     const bool usable = !enabled || enabled();
     if (label) {
-        label->setText(caption ? QString::fromStdString(caption()) : QString());
+        ShowLabel(*label, caption ? QString::fromStdString(caption()) : QString());
         label->setVisible(on);
         label->setEnabled(usable);
     }

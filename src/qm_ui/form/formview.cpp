@@ -1,5 +1,6 @@
 #include "qm_ui/form/formview.h"
 
+#include "qm_ui/form/formletters.h"
 #include "qm_ui/form/gridview.h"
 
 #include <QEvent>
@@ -346,6 +347,7 @@ void CFormView::Refresh()
         field->ShowState();
         field->Show();
     }
+    ShowLetters(m_fields);
     MarkFindings();
     m_refreshing = false;
 }
