@@ -4,10 +4,12 @@
 #include "loadcasetools.h"
 #include "pushovertools.h"
 #include "pushtools.h"
+#include "shell/shell.h"
 #include "structuretools.h"
 #include "ulftools.h"
 
 #include "qm_ui/document/reportview.h"
+#include "qm_ui/shell/preferencesview.h"
 
 void RegisterViews(CViewFactory& factory)
 {
@@ -18,6 +20,7 @@ void RegisterViews(CViewFactory& factory)
     RegisterHingeViews(factory);
     RegisterUlfViews(factory);
     RegisterReportView(factory);
+    RegisterPreferencesView(factory);
 }
 
 T_COMMANDS ToolCommands(T_DESKTOP& desktop)
@@ -25,7 +28,8 @@ T_COMMANDS ToolCommands(T_DESKTOP& desktop)
     T_COMMANDS all;
     for (const T_COMMANDS& part :
          {PushCommands(desktop), PushoverCommands(desktop), LoadCaseCommands(desktop),
-          StructureCommands(desktop), HingeCommands(desktop), UlfCommands(desktop)})
+          StructureCommands(desktop), HingeCommands(desktop), UlfCommands(desktop),
+          ShellCommands(desktop)})
         all.insert(all.end(), part.begin(), part.end());
     return all;
 }
