@@ -2,6 +2,8 @@
 
 #include "explorerpane.h"
 #include "reporttools.h"
+#include "shell/menus.h"
+#include "shell/shell.h"
 #include "toolcommands.h"
 
 #include "qm_base/messagehistory.h"
@@ -61,6 +63,7 @@ CMainWindow::CMainWindow()
     ShowTexts();
     Refresh();
     resize(1280, 800);
+    m_shell = std::make_unique<CShell>(*this);
     m_clock.start();
     constexpr int kTickMs = 1000;
     auto* timer = new QTimer(this);
@@ -72,6 +75,8 @@ CMainWindow::CMainWindow()
 CMainWindow::~CMainWindow()
 {
     SetMessageHistorySink({});
+    m_shell.reset();
+    delete takeCentralWidget(); // panes tell the selection, which goes before the window's children
 }
 
 // ---- panes and menus ----------------------------------------------------------------------------
@@ -106,6 +111,7 @@ void CMainWindow::MakeMenus()
     for (const T_COMMANDS& part : {FileCommands(), EditCommands(), ViewCommands(),
                                    ToolCommands(m_desktop), WindowCommands()})
         m_commands.insert(m_commands.end(), part.begin(), part.end());
+    ArrangeMenus(m_commands);
     std::map<std::string, QMenu*> menus;
     for (std::size_t i = 0; i < m_commands.size(); ++i) {
         const T_COMMAND& command = m_commands[i];
@@ -120,6 +126,7 @@ void CMainWindow::MakeMenus()
             continue;
         }
         QAction* action = menu->addAction(QString());
+        action->setObjectName(command.key);
         action->setShortcut(QKeySequence(QLatin1String(command.keys)));
         action->setCheckable(command.checked != nullptr);
         connect(action, &QAction::triggered, this, [this, i] {
@@ -129,6 +136,7 @@ void CMainWindow::MakeMenus()
         m_actions.emplace_back(action, i);
         if (std::string_view(command.key) == "IDS_QM_UI_OPEN") {
             m_recent = menu->addMenu(QString());
+            m_recent->menuAction()->setObjectName("IDS_QM_UI_RECENT");
             connect(m_recent, &QMenu::aboutToShow, this, [this] { ShowRecent(); });
         }
     }
@@ -158,6 +166,7 @@ void CMainWindow::ShowTexts()
         dock->setWindowTitle(Text(dock->objectName().toLatin1().constData()));
     m_explorer->Retranslate();
     m_framePane->Retranslate();
+    if (m_shell) m_shell->Retranslate();
 }
 
 void CMainWindow::UpdateActions()
@@ -180,6 +189,7 @@ void CMainWindow::Refresh()
     m_units->setText(QStringLiteral("%1, %2, s").arg(force, length));
     setWindowTitle(QString::fromStdString(m_frame.Title()) + " - " + Text("IDS_QM_PRODUCT"));
     UpdateActions();
+    if (m_shell) m_shell->Refresh();
 }
 
 void CMainWindow::SetLanguage(const std::string& code)
@@ -291,16 +301,8 @@ T_COMMANDS CMainWindow::ViewCommands()
 
 T_COMMANDS CMainWindow::WindowCommands()
 {
-    constexpr const char* kMenu = "IDS_QM_UI_MENU_LANGUAGE";
-    const auto speak = [this, kMenu](const char* key, const char* code) {
-        return T_COMMAND{kMenu, key,
-                         "",    [this, code] { SetLanguage(code); },
-                         {},    [code] { return MMSGFunction::GetLanguage() == code; }};
-    };
     constexpr const char* kAnalysis = "IDS_QM_UI_MENU_ANALYSIS";
-    return {{kAnalysis, "IDS_QM_UI_ANALYSE", "F5", [this] { Analyse(); }},
-            speak("IDS_QM_UI_ENGLISH", "en"),
-            speak("IDS_QM_UI_ITALIAN", "it")};
+    return {{kAnalysis, "IDS_QM_UI_ANALYSE", "F5", [this] { Analyse(); }}};
 }
 
 /// In the person's folder for application data.

@@ -11,6 +11,7 @@
 #include <memory>
 
 class CExplorerPane;
+class CShell;
 class QAction;
 class QLabel;
 class QMenu;
@@ -34,6 +35,7 @@ public:
     CFramePane& Frame() { return *m_framePane; }
     CExplorerPane& Explorer() { return *m_explorer; }
     T_DESKTOP& Desktop() { return m_desktop; }
+    CShell& Shell() { return *m_shell; }
     /// The action of a command by its key, or null.
     QAction* Action(const char* key) const;
     QString Messages() const;
@@ -75,4 +77,5 @@ private:
     T_COMMANDS m_commands;
     std::vector<std::pair<QAction*, std::size_t>> m_actions; // of m_commands
     std::vector<std::pair<QMenu*, const char*>> m_menus;
+    std::unique_ptr<CShell> m_shell; // once the panes are made; it goes before them
 };

@@ -346,11 +346,11 @@ TEST_F(PushoverWindows, OneWindowFollowsTheDocumentAndTheLanguage)
     m_window = &CPushOverWindow::Show(m_main->Desktop());
     EXPECT_EQ(m_window, &CPushOverWindow::Show(m_main->Desktop()));
     EXPECT_EQ("PX_MODE1 EC8", Result().eval.name);
-    Run("IDS_QM_UI_ITALIAN");
+    m_main->SetLanguage("it");
     EXPECT_EQ("&Salva", m_main->Action("IDS_QM_UI_SAVE")->text());
     EXPECT_EQ("Curva pushover", m_window->windowTitle());
     EXPECT_TRUE(QString::fromStdString(Plot().Plot().x.title).startsWith("Spostamento spettrale"));
-    Run("IDS_QM_UI_ENGLISH");
+    m_main->SetLanguage("en");
     ASSERT_TRUE(Open("first-steps"));
     (void)CPushOverWindow::Show(m_main->Desktop());
     const auto& pushes = m_main->Doc().Data().Model().pushovers;

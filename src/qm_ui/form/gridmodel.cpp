@@ -1,12 +1,14 @@
 #include "qm_ui/form/gridmodel.h"
 
 #include "qm_ui/form/localnumber.h"
+#include "qm_ui/shown/showndecimals.h"
 
 #include <QColor>
 
 namespace {
 
-constexpr QRgb kMarked = 0xffffd9d9U, kNoticed = 0xfffff0c2U;
+// Translucent, so that they suit light and dark tables.
+constexpr QRgb kMarked = 0x40ff3b30U, kNoticed = 0x48ffb300U;
 
 std::size_t Size(int n)
 {
@@ -61,6 +63,15 @@ QString CGridModel::Text(const QModelIndex& at) const
                                                          : QString::fromStdString(text);
 }
 
+/// Numbers with the decimals of their quantity; editing and copying take Text.
+QString CGridModel::ShownText(const QModelIndex& at) const
+{
+    const T_GRID_COLUMN& column = Column(at.column());
+    if (column.kind != CELL_KIND::Number) return Text(at);
+    return LocalNumberText(
+        ShownNumber(m_binding.text(Size(at.row()), Size(at.column())), column.head()));
+}
+
 QVariant CGridModel::data(const QModelIndex& at, int role) const
 {
     if (!at.isValid() || at.row() >= m_rows) return {};
@@ -68,6 +79,7 @@ QVariant CGridModel::data(const QModelIndex& at, int role) const
     const bool flag = kind == CELL_KIND::Flag;
     switch (role) {
     case Qt::DisplayRole:
+        return flag ? QVariant() : QVariant(ShownText(at));
     case Qt::EditRole:
         return flag ? QVariant() : QVariant(Text(at));
     case Qt::CheckStateRole:
@@ -87,8 +99,8 @@ QVariant CGridModel::data(const QModelIndex& at, int role) const
         }
         const CELL_TONE tone =
             m_binding.tone ? m_binding.tone(Size(at.row()), Size(at.column())) : CELL_TONE::Plain;
-        if (!mark.empty() || tone == CELL_TONE::Fault) return QColor(kMarked);
-        return tone == CELL_TONE::Notice ? QVariant(QColor(kNoticed)) : QVariant();
+        if (!mark.empty() || tone == CELL_TONE::Fault) return QColor::fromRgba(kMarked);
+        return tone == CELL_TONE::Notice ? QVariant(QColor::fromRgba(kNoticed)) : QVariant();
     }
     default:
         return {};

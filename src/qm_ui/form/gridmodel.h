@@ -27,6 +27,7 @@ public:
 private:
     const T_GRID_COLUMN& Column(int column) const;
     QString Text(const QModelIndex& index) const;
+    QString ShownText(const QModelIndex& index) const;
 
     T_GRID_BINDING m_binding;
     ChangedFn m_changed;

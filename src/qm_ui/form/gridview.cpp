@@ -171,7 +171,7 @@ QString CGridView::ChosenText() const
                 m_model->index(static_cast<int>(range.row + r), static_cast<int>(range.column + c));
             const QVariant check = at.data(Qt::CheckStateRole);
             cells << (check.isValid() ? QString(check.toInt() == Qt::Checked ? "1" : "0")
-                                      : at.data(Qt::DisplayRole).toString());
+                                      : at.data(Qt::EditRole).toString());
         }
         lines << cells.join(QLatin1Char('\t'));
     }

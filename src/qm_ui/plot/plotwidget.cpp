@@ -1,6 +1,8 @@
 #include "qm_ui/plot/plotwidget.h"
 
+#include "qm_base/textformat.h"
 #include "qm_ui/plot/plot.h"
+#include "qm_ui/shown/showndecimals.h"
 
 #include <QColor>
 #include <QFont>
@@ -26,7 +28,9 @@ constexpr int kDigits = 6;            // of the read-out
 QString AxisLine(const T_PLOT_AXIS& axis, const char* fallback, double value)
 {
     const std::string name = axis.title.empty() ? fallback : axis.title;
-    return QString::fromStdString(name + ": " + PlotNumberText(value, kDigits));
+    const std::string whole = ShortestText(value), shown = ShownNumber(whole, name);
+    return QString::fromStdString(name + ": " +
+                                  (shown == whole ? PlotNumberText(value, kDigits) : shown));
 }
 
 } // namespace
