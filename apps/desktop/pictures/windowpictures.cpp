@@ -1,17 +1,20 @@
 #include "windowpictures.h"
 
 #include "mainwindow.h"
-
-#include "qm_base/msgfunction.h"
+#include "shell/theme.h"
 
 #include <QApplication>
 #include <QDir>
+#include <QFile>
+#include <QFileInfo>
 #include <QPixmap>
+#include <QRegularExpression>
 #include <QSettings>
 #include <QStandardPaths>
 #include <QTemporaryDir>
 
 #include <cstdio>
+#include <string_view>
 
 namespace {
 
@@ -22,40 +25,75 @@ void Settle()
         QApplication::processEvents();
 }
 
-bool WriteOne(const T_WINDOW_EXAMPLE& example, const QString& file, const QString& examples)
+/// Windows that are larger than the screen have to scroll, as on a real one.
+void FitInto(QWidget& window, const QSize& most, bool isMain)
+{
+    if (most.isEmpty()) return;
+    window.resize(isMain ? most : window.size().boundedTo(most));
+}
+
+bool WriteOne(const T_WINDOW_EXAMPLE& example, const QString& language,
+              const T_PICTURE_OPTIONS& options)
 {
     CMainWindow main;
-    main.SetLanguage(QFileInfo(file).completeBaseName().endsWith("-it") ? "it" : "en");
-    const QString model = examples + "/" + QString::fromStdString(example.model) + "/case.json";
+    main.SetLanguage(language.toStdString());
+    ApplyTheme(options.theme);
+    const QString model =
+        options.examples + "/" + QString::fromStdString(example.model) + "/case.json";
     if (!example.model.empty() && !main.Open(model)) return false;
+    FitInto(main, options.size, true);
     main.show();
     Settle();
     std::unique_ptr<QWidget> window;
     if (example.make) window = example.make(main);
     QWidget& shown = window ? *window : static_cast<QWidget&>(main);
     shown.show();
+    FitInto(shown, options.size, !window);
     Settle();
+    const QString file = QStringLiteral("%1/%2-%3.png")
+                             .arg(options.folder, QString::fromStdString(example.name), language);
     return shown.grab().save(file);
+}
+
+/// The argument that follows an option; empty: it is not there.
+QString ArgumentOf(int argc, char** argv, std::string_view option)
+{
+    for (int i = 1; i < argc; ++i) {
+        const std::string_view argument = argv[i];
+        if (argument == option && i + 1 < argc) return QString::fromLocal8Bit(argv[i + 1]);
+        if (argument.starts_with(option) && argument.size() > option.size() &&
+            argument[option.size()] == '=')
+            return QString::fromLocal8Bit(argv[i] + option.size() + 1);
+    }
+    return {};
 }
 
 } // namespace
 
-int WriteWindowPictures(const QString& folder, const QString& examples)
+int WriteWindowPictures(const T_PICTURE_OPTIONS& options)
 {
-    if (!QDir().mkpath(folder)) return 1;
+    if (!QDir().mkpath(options.folder)) return 1;
     // The person's settings and recent files stay as they are.
     const QTemporaryDir settings;
     QSettings::setDefaultFormat(QSettings::IniFormat);
     QSettings::setPath(QSettings::IniFormat, QSettings::UserScope, settings.path());
     QStandardPaths::setTestModeEnabled(true);
     int failed = 0;
-    for (const T_WINDOW_EXAMPLE& example : WindowExamples())
-        for (const char* language : {"en", "it"}) {
-            const QString file = QStringLiteral("%1/%2-%3.png")
-                                     .arg(folder, QString::fromStdString(example.name), language);
-            if (WriteOne(example, file, examples)) continue;
-            std::fprintf(stderr, "qm-rps-desktop: no picture %s\n", file.toUtf8().constData());
+    for (const T_WINDOW_EXAMPLE& example : WindowExamples()) {
+        if (!QString::fromStdString(example.name).startsWith(options.only)) continue;
+        for (const QString& language : options.languages) {
+            if (WriteOne(example, language, options)) continue;
+            std::fprintf(stderr, "qm-rps-desktop: no picture of %s, %s\n", example.name.c_str(),
+                         language.toUtf8().constData());
             ++failed;
         }
+    }
     return failed;
+}
+
+void OffscreenScreen(int argc, char** argv)
+{
+    if (ArgumentOf(argc, argv, "--pictures").isEmpty()) return;
+    const QString scale = ArgumentOf(argc, argv, "--scale");
+    if (!scale.isEmpty()) qputenv("QT_SCALE_FACTOR", scale.toLatin1());
 }

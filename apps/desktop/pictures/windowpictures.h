@@ -3,7 +3,11 @@
 
 #include "desktop.h"
 
+#include "qm_rps/shell/preferences.h"
+
+#include <QSize>
 #include <QString>
+#include <QStringList>
 
 #include <functional>
 #include <memory>
@@ -21,10 +25,24 @@ struct T_WINDOW_EXAMPLE {
     std::function<std::unique_ptr<QWidget>(CMainWindow& main)> make{};
 };
 
-/// Renders every window in both languages into a folder, as NAME-LANGUAGE.png, at this scale of
-/// the screen. examples: folder of the example models. Returns the number of pictures that could
+/// How pictures are made. Scale of the screen and its size are those that the program started with
+/// (see OffscreenScreen).
+struct T_PICTURE_OPTIONS {
+    QString folder;
+    QString examples; // folder of the example models
+    QStringList languages{"en", "it"};
+    THEME theme = THEME::Light;
+    QSize size{}; // of the main window, and the most of others; empty: as wanted
+    QString only; // windows whose names begin so; empty: all
+};
+
+/// Renders windows into the folder, as NAME-LANGUAGE.png. Returns the number of pictures that could
 /// not be made; each is named on stderr.
-int WriteWindowPictures(const QString& folder, const QString& examples);
+int WriteWindowPictures(const T_PICTURE_OPTIONS& options);
+
+/// To be called before the application is made: a screen in memory for these arguments
+/// (--scale 2, --size 1024x700), where --pictures is among them.
+void OffscreenScreen(int argc, char** argv);
 
 /// The windows of all tools.
 std::vector<T_WINDOW_EXAMPLE> WindowExamples();
