@@ -4,6 +4,10 @@
 set(share ${CMAKE_INSTALL_DATADIR})
 set(packaging ${PROJECT_SOURCE_DIR}/packaging)
 
+set(CPACK_PACKAGE_CONTACT "qm_rps maintainers <maintainers@qm-rps.invalid>")
+set(CPACK_DEBIAN_PACKAGE_RELEASE 1)
+configure_file(${packaging}/changelog.Debian.in ${PROJECT_BINARY_DIR}/changelog.Debian @ONLY)
+
 # The program writes its manual pages and completions, so they say what --help says.
 set(help ${PROJECT_BINARY_DIR}/help)
 set(pages)
@@ -13,9 +17,12 @@ endif()
 add_custom_command(
   OUTPUT ${help}.stamp
   COMMAND ${CMAKE_COMMAND} -DPROGRAM=$<TARGET_FILE:qm-rps> -DFOLDER=${help} -DPAGES=${pages}
-          -DCHANGES=${PROJECT_SOURCE_DIR}/CHANGELOG.md -P ${PROJECT_SOURCE_DIR}/cmake/writehelp.cmake
+          -DCHANGES=${PROJECT_SOURCE_DIR}/CHANGELOG.md
+          -DDEBIAN_CHANGES=${PROJECT_BINARY_DIR}/changelog.Debian
+          -P ${PROJECT_SOURCE_DIR}/cmake/writehelp.cmake
   COMMAND ${CMAKE_COMMAND} -E touch ${help}.stamp
   DEPENDS qm-rps ${pages} ${PROJECT_SOURCE_DIR}/cmake/writehelp.cmake
+          ${PROJECT_SOURCE_DIR}/CHANGELOG.md ${PROJECT_BINARY_DIR}/changelog.Debian
   COMMENT "Writing manual pages and completions" VERBATIM)
 add_custom_target(qm_help ALL DEPENDS ${help}.stamp)
 
@@ -35,7 +42,8 @@ function(qm_install_notices package component)
   set(folder ${share}/doc/${package})
   install(FILES ${packaging}/copyright ${packaging}/NOTICE DESTINATION ${folder}
           COMPONENT ${component})
-  install(FILES ${help}/changelog.gz DESTINATION ${folder} COMPONENT ${component} OPTIONAL)
+  install(FILES ${help}/changelog.gz ${help}/changelog.Debian.gz DESTINATION ${folder}
+          COMPONENT ${component} OPTIONAL)
 endfunction()
 qm_install_notices(qm-rps cli)
 
@@ -57,22 +65,20 @@ endif()
 
 set(CPACK_GENERATOR DEB)
 set(CPACK_PACKAGE_NAME qm-rps)
-set(CPACK_PACKAGE_CONTACT "qm_rps maintainers <maintainers@qm-rps.invalid>")
 set(CPACK_PACKAGING_INSTALL_PREFIX /usr)
 set(CPACK_STRIP_FILES ON)
 set(CPACK_COMPONENTS_ALL cli)
 set(CPACK_COMPONENTS_GROUPING IGNORE)
 set(CPACK_DEB_COMPONENT_INSTALL ON)
 set(CPACK_DEBIAN_FILE_NAME DEB-DEFAULT)
-set(CPACK_DEBIAN_PACKAGE_RELEASE 1)
 set(CPACK_DEBIAN_PACKAGE_SECTION science)
 set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS ON)
 set(CPACK_DEBIAN_CLI_PACKAGE_NAME qm-rps)
 set(CPACK_DEBIAN_CLI_PACKAGE_RECOMMENDS fonts-dejavu-core)
-set(CPACK_COMPONENT_CLI_DESCRIPTION "The command line: from a pushover analysis, made here or with any solver, to the
-performance point (ATC-40, FEMA 440) or the target displacement (Eurocode 8,
-NTC), with a trace of every trial, a report and pictures; plastic hinges by
-codes; load factors and stay tensions of bridges.")
+set(CPACK_COMPONENT_CLI_DESCRIPTION "The command line: from a pushover analysis, made here or with any solver, to
+the performance point (ATC-40, FEMA 440) or the target displacement
+(Eurocode 8, NTC), with a trace of every trial, a report and pictures;
+plastic hinges by codes; load factors and stay tensions of bridges.")
 if(QM_UI)
   list(APPEND CPACK_COMPONENTS_ALL desktop)
   set(CPACK_DEBIAN_DESKTOP_PACKAGE_NAME qm-rps-desktop)

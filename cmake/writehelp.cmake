@@ -1,4 +1,4 @@
-# cmake -DPROGRAM=qm-rps -DFOLDER=out -DPAGES="a.1;b.1" -P writehelp.cmake
+# cmake -DPROGRAM=qm-rps -DFOLDER=out -DPAGES="a.1;b.1" -DCHANGES=... -DDEBIAN_CHANGES=... -P writehelp.cmake
 # Lets the program write its help in other forms: manual pages in both languages, packed as man reads
 # them, and the completion of shells. PAGES are further manual pages, written by hand.
 cmake_minimum_required(VERSION 3.25)
@@ -22,6 +22,7 @@ if(gzip) # -n: no name and no time, so that the same input gives the same bytes
   file(GLOB pages ${FOLDER}/man/man1/*.1 ${FOLDER}/man/it/man1/*.1)
   run(${gzip} -9n ${pages})
   run(${gzip} -9nc ${CHANGES} OUTPUT_FILE ${FOLDER}/changelog.gz)
+  run(${gzip} -9nc ${DEBIAN_CHANGES} OUTPUT_FILE ${FOLDER}/changelog.Debian.gz)
 else()
   message(STATUS "no gzip: manual pages stay unpacked, no changelog")
 endif()

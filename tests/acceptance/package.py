@@ -61,6 +61,8 @@ def check_files(root):
                  "share/icons/hicolor/scalable/apps/qm-rps.svg", "share/qm-rps/docs/guide/start.md"):
         expect((root / "usr" / name).is_file(), f"no {name}")
     for package in ("qm-rps", "qm-rps-desktop"):
+        for name in ("changelog.gz", "changelog.Debian.gz", "NOTICE"):
+            expect((root / f"usr/share/doc/{package}" / name).is_file(), f"{package}: no {name}")
         text = (root / f"usr/share/doc/{package}/copyright").read_text()
         expect("All rights reserved until the owner chooses" in text, f"{package}: copyright")
     for tool, *words in (("desktop-file-validate", "applications/qm-rps-desktop.desktop"),
