@@ -3,7 +3,9 @@
 package.py BUILD; ends with 77 (skipped) where dpkg or cpack are missing. Nothing outside a temporary
 folder is touched, no network is asked.
 """
+import gzip
 import pathlib
+import re
 import shutil
 import subprocess
 import sys
@@ -85,6 +87,9 @@ def check_programs(root, folder, version):
     row = next(line for line in table.splitlines() if line.startswith("PX ATC-40 A")).split()
     expect(abs(float(row[6]) - BY_HAND_D) < 1e-4, f"D: {row}")
     run("qm-rps-desktop", "--start-only", case, env=environment)
+    page = gzip.decompress((root / "usr/share/man/man1/qm-rps-desktop.1.gz").read_bytes()).decode().replace("\\", "")
+    for option in re.findall(r"--[a-z][a-z-]+", run("qm-rps-desktop", "--help", env=environment)):
+        expect(option in page, f"the manual page of the desktop does not tell {option}")
 
 
 def main(folder):
