@@ -113,7 +113,7 @@ TEST_F(NewModels, AFrameCarriesWhatItWasGiven)
     EXPECT_EQ(4U, model.at("modes").size());
     EXPECT_EQ(8U, model.at("pushover").size());
     ExpectHolds(Done("storeys f.json"), {"1F", "2F", "3.5"});
-    EXPECT_NE(std::string::npos, Done("push f.json --of 'PX+ uniform'").find("PX+ uniform"));
+    EXPECT_NE(std::string::npos, Done("push f.json --case 'PX+ uniform'").find("PX+ uniform"));
 }
 
 TEST_F(NewModels, ASpectrumIsAddedChangedAndRemoved)

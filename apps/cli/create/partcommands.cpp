@@ -8,6 +8,7 @@
 #include "qm_db/editscope.h"
 #include "qm_rps/create/spectrumtext.h"
 #include "qm_rps/desk/elementlist.h"
+#include "qm_rps/modesdlg.h"
 #include "qm_rps/spectrumdlg.h"
 #include "qm_rps/storeyguidedlg.h"
 
@@ -91,5 +92,37 @@ EXIT_CODE RunSpectrum(const T_SPECTRUM_OPTIONS& o)
         std::printf("%s: %s\n%s", record.name.c_str(), SpectrumText(record).c_str(),
                     TableText(rows).c_str());
     }
+    return EXIT_CODE::Done;
+}
+
+EXIT_CODE RunModes(const T_MODES_OPTIONS& o)
+{
+    const int edits = (o.find > 0) + (o.remove > 0) + (o.period.has_value() ? 1 : 0);
+    if (edits > 1 || (edits == 1) != !o.out.empty())
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_MODES_OUT"));
+    if (o.direction != "X" && o.direction != "Y")
+        return Complain(EXIT_CODE::Usage, Say("IDS_QM_CLI_NEW_WORD", "--direction", o.direction));
+    CDBDoc doc;
+    if (const EXIT_CODE code = Open(doc, o.file, o.out, o.overwrite); code != EXIT_CODE::Done)
+        return code;
+    CModesDlg dialog(doc);
+    dialog.m_count = o.find;
+    dialog.m_period = o.period.value_or(0.0);
+    dialog.m_direction = o.direction == "Y" ? 1 : 0;
+    dialog.m_shape = o.shape;
+    dialog.OnChoose(o.remove - 1);
+    const int done = o.find > 0     ? dialog.OnFind()
+                     : o.remove > 0 ? dialog.OnDelete()
+                     : o.period     ? dialog.OnAdd()
+                                    : 1;
+    if (!done) return Complain(EXIT_CODE::BadInput, o.file + ": " + dialog.Messages().back().text);
+    if (!o.out.empty())
+        if (const EXIT_CODE code = SaveDocument(doc, o.out); code != EXIT_CODE::Done) return code;
+    const T_TEXT_TABLE modes = dialog.Table();
+    T_TABLE_ROWS rows(1);
+    for (const T_TEXT_COLUMN& column : modes.columns)
+        rows.front().push_back(column.head);
+    rows.insert(rows.end(), modes.rows.begin(), modes.rows.end());
+    std::printf("%s", TableText(rows).c_str());
     return EXIT_CODE::Done;
 }

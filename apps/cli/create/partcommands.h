@@ -18,3 +18,11 @@ struct T_SPECTRUM_OPTIONS {
     bool overwrite = false;
 };
 EXIT_CODE RunSpectrum(const T_SPECTRUM_OPTIONS& options);
+
+struct T_MODES_OPTIONS {
+    std::string file, out, shape, direction = "X";
+    std::optional<double> period; // s, of a typed mode
+    int find = 0, remove = 0;     // how many to find; number of the one to delete
+    bool overwrite = false;
+};
+EXIT_CODE RunModes(const T_MODES_OPTIONS& options);

@@ -87,7 +87,9 @@ void AddNew(CLI::App& app, EXIT_CODE& code)
     });
 }
 
-void AddParts(CLI::App& app, EXIT_CODE& code)
+namespace {
+
+void AddStoreys(CLI::App& app, EXIT_CODE& code)
 {
     auto* storeys = app.add_subcommand("storeys", Say("IDS_QM_HELP_STOREYS"));
     auto s = std::make_shared<T_STOREYS_OPTIONS>();
@@ -97,7 +99,10 @@ void AddParts(CLI::App& app, EXIT_CODE& code)
     AddOverwrite(storeys, s->overwrite);
     AddExample(storeys, "storeys examples/space-frame-3d/case.json --tolerance 0.1");
     storeys->callback([=, &code] { code = RunStoreys(*s); });
+}
 
+void AddSpectrum(CLI::App& app, EXIT_CODE& code)
+{
     auto* spectrum = app.add_subcommand("spectrum", Say("IDS_QM_HELP_SPECTRUM"));
     auto o = std::make_shared<T_SPECTRUM_OPTIONS>();
     AddFile(spectrum, o->file);
@@ -107,4 +112,30 @@ void AddParts(CLI::App& app, EXIT_CODE& code)
     AddOverwrite(spectrum, o->overwrite);
     AddExample(spectrum, "spectrum examples/first-steps/case.json");
     spectrum->callback([=, &code] { code = RunSpectrum(*o); });
+}
+
+void AddModes(CLI::App& app, EXIT_CODE& code)
+{
+    auto* modes = app.add_subcommand("modes", Say("IDS_QM_HELP_MODES"));
+    auto m = std::make_shared<T_MODES_OPTIONS>();
+    AddFile(modes, m->file);
+    modes->add_option("--find", m->find, Say("IDS_QM_HELP_MODES_FIND"));
+    modes->add_option("--period", m->period, Say("IDS_QM_HELP_MODES_PERIOD"));
+    modes->add_option("--direction", m->direction, Say("IDS_QM_HELP_MODES_DIRECTION"))
+        ->capture_default_str();
+    modes->add_option("--shape", m->shape, Say("IDS_QM_HELP_MODES_SHAPE"));
+    modes->add_option("--delete", m->remove, Say("IDS_QM_HELP_MODES_DELETE"));
+    modes->add_option("-o", m->out, Say("IDS_QM_HELP_NEW_OUT"));
+    AddOverwrite(modes, m->overwrite);
+    AddExample(modes, "modes examples/space-frame-3d/case.json --find 9 -o modes.json");
+    modes->callback([=, &code] { code = RunModes(*m); });
+}
+
+} // namespace
+
+void AddParts(CLI::App& app, EXIT_CODE& code)
+{
+    AddStoreys(app, code);
+    AddSpectrum(app, code);
+    AddModes(app, code);
 }

@@ -1,6 +1,7 @@
 // Models around curves, frames, storeys and spectra: against hand calculation.
 #include "qm_rps/curvewizarddlg.h"
 #include "qm_rps/frameguidedlg.h"
+#include "qm_rps/modesdlg.h"
 #include "qm_rps/spectrumdlg.h"
 #include "qm_rps/storeyguidedlg.h"
 
@@ -259,4 +260,34 @@ TEST(StoreyLevels, JoinNodesWithinTheToleranceInOneUndoStep)
     EXPECT_EQ(1U, doc.Data().Model().storeys.size());
     dialog.OnTolerance(-1.0);
     EXPECT_EQ("tolerance", dialog.Findings().at(0).field);
+}
+
+TEST(Modes, ATypedShapeHasItsMassAndAnEditOfItsOwn)
+{
+    CDBDoc doc;
+    T_MODEL_CONTENT content;
+    T_CURVE_FACTS facts;
+    T_FINDING fault;
+    ASSERT_TRUE(MakeCurveCase(ThreeStoreys(), content, facts, fault));
+    content.model.pushovers.clear();
+    content.model.evaluations.clear();
+    content.results.clear();
+    doc.Data().Assign(content);
+    CModesDlg dialog(doc);
+    dialog.m_period = 0.2;
+    for (const char* const shape : {"1, 1", "0, 0, 0", "1, a, 1"}) {
+        dialog.m_shape = shape;
+        EXPECT_FALSE(dialog.OnAdd()) << shape;
+    }
+    dialog.m_shape = "1, 0.5, -0.5";
+    ASSERT_TRUE(dialog.OnAdd());
+    // (1 + 0.5 - 0.5)2 / (1 + 0.25 + 0.25) / 3 masses: 22.22 %
+    EXPECT_EQ("22.22", dialog.Table().rows.at(1).at(2));
+    dialog.OnChoose(0);
+    ASSERT_TRUE(dialog.OnDelete());
+    ASSERT_EQ(1U, doc.Data().Model().modes.size());
+    EXPECT_EQ(0.2, doc.Data().Model().modes.at(1).period);
+    EXPECT_FALSE(dialog.OnDelete()); // none is chosen
+    ASSERT_TRUE(doc.Undo().Undo());
+    EXPECT_EQ(2U, doc.Data().Model().modes.size());
 }
