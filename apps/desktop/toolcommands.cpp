@@ -2,6 +2,7 @@
 
 #include "hingetools.h"
 #include "loadcasetools.h"
+#include "newtools.h"
 #include "pushovertools.h"
 #include "pushtools.h"
 #include "shell/shell.h"
@@ -21,6 +22,7 @@ void RegisterViews(CViewFactory& factory)
     RegisterUlfViews(factory);
     RegisterReportView(factory);
     RegisterPreferencesView(factory);
+    RegisterNewViews(factory);
 }
 
 T_COMMANDS ToolCommands(T_DESKTOP& desktop)
@@ -29,7 +31,7 @@ T_COMMANDS ToolCommands(T_DESKTOP& desktop)
     for (const T_COMMANDS& part :
          {PushCommands(desktop), PushoverCommands(desktop), LoadCaseCommands(desktop),
           StructureCommands(desktop), HingeCommands(desktop), UlfCommands(desktop),
-          ShellCommands(desktop)})
+          PartCommands(desktop), ShellCommands(desktop)})
         all.insert(all.end(), part.begin(), part.end());
     return all;
 }
@@ -37,6 +39,6 @@ T_COMMANDS ToolCommands(T_DESKTOP& desktop)
 void OpenRecord(T_DESKTOP& desktop, EXPLORER_TABLE table, int key)
 {
     for (const auto open : {OpenPushoverRecord, OpenLoadCaseRecord, OpenStructureRecord,
-                            OpenHingeRecord, OpenUlfRecord})
+                            OpenHingeRecord, OpenUlfRecord, OpenNewRecord})
         if (open(desktop, table, key)) return;
 }

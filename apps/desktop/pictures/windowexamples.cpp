@@ -3,6 +3,7 @@
 #include "hingetools.h"
 #include "loadcasetools.h"
 #include "mainwindow.h"
+#include "newtools.h"
 #include "pushovertools.h"
 #include "pushtools.h"
 #include "reporttools.h"
@@ -64,7 +65,7 @@ std::vector<T_WINDOW_EXAMPLE> WindowExamples()
                                       {"help", "", help}};
     for (auto& part : {PushWindowExamples(), PushoverWindowExamples(), LoadCaseWindowExamples(),
                        StructureWindowExamples(), ReportWindowExamples(), HingeWindowExamples(),
-                       UlfWindowExamples()})
+                       UlfWindowExamples(), NewWindowExamples()})
         all.insert(all.end(), part.begin(), part.end());
     return all;
 }
