@@ -1,6 +1,7 @@
 #include "mainwindow.h"
 
 #include "explorerpane.h"
+#include "newtools.h"
 #include "reporttools.h"
 #include "shell/menus.h"
 #include "shell/shell.h"
@@ -111,6 +112,8 @@ void CMainWindow::MakeMenus()
     for (const T_COMMANDS& part : {FileCommands(), EditCommands(), ViewCommands(),
                                    ToolCommands(m_desktop), WindowCommands()})
         m_commands.insert(m_commands.end(), part.begin(), part.end());
+    const T_COMMANDS fresh = NewCommands(m_desktop); // below the first of the menu File, New
+    m_commands.insert(m_commands.begin() + 1, fresh.begin(), fresh.end());
     ArrangeMenus(m_commands);
     std::map<std::string, QMenu*> menus;
     for (std::size_t i = 0; i < m_commands.size(); ++i) {
