@@ -243,6 +243,19 @@ private:
     T_MODEL_CONTENT m_out;
 };
 
+/// What no building has: wrong units, most likely.
+bool LooksOdd(const T_CURVE_CASE& in, const T_CURVE_FACTS& facts)
+{
+    constexpr double kLeastRatio = 0.005, kMostRatio = 3.0;   // base shear over weight
+    constexpr double kLeastPeriod = 0.02, kMostPeriod = 10.0; // s
+    constexpr double kMostDrift = 0.3;                        // displacement over height
+    const double ratio = facts.peakForce / facts.weight;
+    const double height = std::accumulate(in.heights.begin(), in.heights.end(), 0.0);
+    return !(ratio >= kLeastRatio && ratio <= kMostRatio) ||
+           !(facts.period >= kLeastPeriod && facts.period <= kMostPeriod) ||
+           !(facts.read.points.back().displacement <= kMostDrift * height);
+}
+
 std::string WithUnit(double value, const std::string& unit)
 {
     return FormatText("%.6g ", value) + unit;
@@ -280,7 +293,6 @@ int MakeCurveCase(const T_CURVE_CASE& in, T_MODEL_CONTENT& out, T_CURVE_FACTS& f
 
 std::vector<std::string> CurveCaseNotes(const T_CURVE_CASE& in, const T_CURVE_FACTS& facts)
 {
-    constexpr double kLeastRatio = 0.005, kMostRatio = 3.0; // of base shear and weight: units?
     std::vector<std::string> notes = CurveReadNotes(facts.read);
     const std::string force(NameOf(in.units.force)), length(NameOf(in.units.length));
     const double tonnes = facts.totalMass * SiFactor(in.units, kDimMass) / 1000.0;
@@ -294,7 +306,7 @@ std::vector<std::string> CurveCaseNotes(const T_CURVE_CASE& in, const T_CURVE_FA
     const double ratio = facts.peakForce / facts.weight;
     notes.push_back(
         Say("IDS_QM_NEW_PEAK", WithUnit(facts.peakForce, force), FormatText("%.4g", ratio)));
-    if (!(ratio >= kLeastRatio && ratio <= kMostRatio)) notes.push_back(Say("IDS_QM_NEW_ODD"));
+    if (LooksOdd(in, facts)) notes.push_back(Say("IDS_QM_NEW_ODD"));
     if (facts.read.storeys == 0 && in.heights.size() > 1)
         notes.push_back(Say("IDS_QM_NEW_NO_DRIFTS"));
     return notes;

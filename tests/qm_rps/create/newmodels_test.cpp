@@ -73,6 +73,34 @@ TEST(CurveCase, TakesMassesInEveryUnit)
     }
 }
 
+TEST(CurveCase, SaysThatUnitsLookWrong)
+{
+    const std::tuple<bool, T_UNITS, double> rows[] = {
+        {false, {FORCE_UNIT::kN, LENGTH_UNIT::m}, 100.0},
+        {true, {FORCE_UNIT::kN, LENGTH_UNIT::m}, 0.1},  // V / W 290
+        {true, {FORCE_UNIT::kN, LENGTH_UNIT::m}, 1e5}}; // T 19.9 s
+    for (const auto& [isOdd, units, mass] : rows) {
+        T_CURVE_CASE in = ThreeStoreys();
+        in.units = units;
+        in.masses = {mass, mass, mass};
+        T_MODEL_CONTENT content;
+        T_CURVE_FACTS facts;
+        T_FINDING fault;
+        ASSERT_TRUE(MakeCurveCase(in, content, facts, fault));
+        std::string all;
+        for (const std::string& note : CurveCaseNotes(in, facts))
+            all += note;
+        EXPECT_EQ(isOdd, all.find("check the units") != std::string::npos) << mass;
+    }
+    T_CURVE_CASE in = ThreeStoreys(); // displacements in mm taken for m
+    in.curve.text = "0 0\n72 3.6\n720 36\n";
+    T_MODEL_CONTENT content;
+    T_CURVE_FACTS facts;
+    T_FINDING fault;
+    ASSERT_TRUE(MakeCurveCase(in, content, facts, fault));
+    EXPECT_GT(facts.period, 10.0);
+}
+
 TEST(CurveCase, RefusesWhatDoesNotFit)
 {
     const std::pair<const char*, std::function<void(T_CURVE_CASE&)>> rows[] = {
