@@ -1,4 +1,5 @@
 // The arguments of the commands on unknown load factors.
+#include "factors/tunecommand.h"
 #include "iteratecommands.h"
 #include "registershared.h"
 #include "registrations.h"
@@ -56,6 +57,20 @@ void AddIterate(CLI::App* ulf, EXIT_CODE& code)
     sub->callback([=, &code] { code = RunUlfIterate(*o); });
 }
 
+void AddTune(const T_GROUP& group)
+{
+    const auto o = std::make_shared<T_TUNE_OPTIONS>();
+    auto* tune = AddOne(group, "tune", Say("IDS_QM_HELP_ULF_TUNE"),
+                        " --item LEVEL --factor T101=1.2 --plot deck.svg", o, RunUlfTune);
+    tune->add_option("--item", o->item, Say("IDS_QM_HELP_ULF_ITEM"))->required();
+    tune->add_option("--factor", o->factors, Say("IDS_QM_HELP_ULF_TUNE_FACTOR"))
+        ->allow_extra_args(false);
+    tune->add_option("--deck", o->deck, Say("IDS_QM_HELP_ULF_TUNE_DECK"));
+    tune->add_option("--plot", o->plot, Say("IDS_QM_HELP_ULF_TUNE_PLOT"));
+    tune->add_option("--plot-moments", o->plotMoments, Say("IDS_QM_HELP_ULF_TUNE_MOMENTS"));
+    AddOverwrite(tune, o->overwrite);
+}
+
 } // namespace
 
 void AddUlf(CLI::App& app, EXIT_CODE& code)
@@ -69,6 +84,7 @@ void AddUlf(CLI::App& app, EXIT_CODE& code)
     AddItem(AddOne(group, "check", Say("IDS_QM_HELP_CHECK_RULES"), "", o, RunUlfCheck), o, false);
     AddSolve(group, o);
     AddIterate(ulf, code);
+    AddTune(group);
     auto* explain = AddOne(group, "explain", Say("IDS_QM_HELP_ULF_EXPLAIN"),
                            " --item \"NO UPLIFT\"", o, RunUlfExplain);
     AddItem(explain, o, true);

@@ -2,6 +2,7 @@
 
 #include "qm_rps/loadcombinationdlg.h"
 #include "qm_rps/ulfiterationrundlg.h"
+#include "qm_rps/ulftuningdlg.h"
 #include "qm_rps/unknownloadfactorconstraintdlg.h"
 #include "qm_rps/unknownloadfactordlg.h"
 #include "qm_rps/unknownloadfactoritemdlg.h"
@@ -12,6 +13,7 @@
 #include "qm_ui/factors/ulfitemview.h"
 #include "qm_ui/factors/ulfiterationview.h"
 #include "qm_ui/factors/ulfresultview.h"
+#include "qm_ui/factors/ulftuningview.h"
 #include "qm_ui/loadcase/loadcombinationview.h"
 
 void RegisterUlfViews(CViewFactory& factory)
@@ -25,6 +27,7 @@ void RegisterUlfViews(CViewFactory& factory)
     RegisterUlfConstraintViews(factory);
     RegisterUlfResultViews(factory, hooks);
     RegisterUlfIterationViews(factory);
+    RegisterUlfTuningView(factory, hooks);
     RegisterLoadCombinationView(factory);
 }
 
@@ -59,10 +62,14 @@ T_COMMANDS UlfCommands(T_DESKTOP& d)
 {
     constexpr const char* kMenu = "IDS_QM_UI_MENU_ULF";
     const auto hasItems = [&d] { return !d.doc.Data().Model().ulfStageItems.empty(); };
+    const auto hasAny = [&d, hasItems] {
+        return hasItems() || !d.doc.Data().Model().ulfItems.empty();
+    };
     return {{kMenu, "IDS_QM_UI_ULF_ITEMS", "Ctrl+L", [&d] { Show<CUnknownLoadFactorDlg>(d); }},
             {kMenu, "IDS_QM_UI_ULF_CONSTRAINTS", "Ctrl+Shift+L",
              [&d] { Show<CUnknownTableTabGrid1>(d); }},
             {kMenu},
+            {kMenu, "IDS_QM_TUNE_COMMAND", "", [&d] { Show<CUlfTuningDlg>(d); }, hasAny},
             {kMenu, "IDS_QM_UI_ULF_ITER_SETTINGS", "", [&d] { ShowSettings(d); }},
             {kMenu, "IDS_QM_UI_ULF_ITERATE", "", [&d] { Show<CUlfIterationRunDlg>(d); }, hasItems}};
 }

@@ -6,6 +6,7 @@
 #include "qm_rps/ulfexplanationdlg.h"
 #include "qm_rps/ulfiterationdochost.h"
 #include "qm_rps/ulfiterationrundlg.h"
+#include "qm_rps/ulftuningdlg.h"
 #include "qm_rps/unknownloadfactorconstraintdlg.h"
 #include "qm_rps/unknownloadfactordlg.h"
 #include "qm_rps/unknownloadfactoritemdlg.h"
@@ -99,6 +100,15 @@ WINDOW RunWindow(CMainWindow& main)
     return done ? WindowOf(main, std::move(run)) : nullptr;
 }
 
+/// One factor turned up.
+WINDOW TuningWindow(CMainWindow& main)
+{
+    auto tuned = std::make_unique<CUlfTuningDlg>(main.Doc());
+    if (!tuned->OnSolve({}) || !tuned->OnFactor(2, 1.1 * tuned->Factor(2))) return nullptr;
+    tuned->m_chosen = 2;
+    return WindowOf(main, std::move(tuned));
+}
+
 WINDOW StepWindow(CMainWindow& main)
 {
     T_ULF_ITER_STEP step{0, main.Doc().Path(), {}, 0.0};
@@ -134,6 +144,7 @@ std::vector<T_WINDOW_EXAMPLE> UlfWindowExamples()
              }},
             {"ulf-result-beam", kBeam, result(1)},
             {"ulf-explanation", kBeam, [](CMainWindow& m) { return ExplanationWindow(m, 4); }},
+            {"ulf-tuning", kBridge, TuningWindow},
             {"ulf-stage-item", "cable-stayed-bridge-staged", WindowMaker<CUnknownStageItemDlg>(1)},
             {"ulf-iteration-settings", kHangers, SettingsWindow},
             {"ulf-iteration-step", kHangers, StepWindow},

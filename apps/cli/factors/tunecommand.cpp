@@ -1,0 +1,96 @@
+#include "factors/tunecommand.h"
+
+#include "console/tabletext.h"
+#include "inputfile.h"
+#include "output.h"
+#include "qm_base/say.h"
+#include "qm_base/textformat.h"
+#include "qm_rps/section/sectionexport.h"
+#include "qm_rps/ulftuningdlg.h"
+
+#ifdef QM_UI
+#include "qm_ui/factors/tuningplot.h"
+#endif
+
+#include <algorithm>
+#include <cstdio>
+
+namespace {
+
+std::string TextOf(const T_TEXT_TABLE& table)
+{
+    T_TABLE_ROWS rows(1);
+    for (const T_TEXT_COLUMN& column : table.columns)
+        rows.front().push_back(column.head);
+    rows.insert(rows.end(), table.rows.begin(), table.rows.end());
+    return TableText(rows);
+}
+
+/// "T101=1.2": the whole name of an unknown, or of its load case alone.
+bool TakeFactor(CUlfTuningDlg& tuned, const std::string& text)
+{
+    const std::size_t at = text.rfind('=');
+    const std::optional<double> factor =
+        at == std::string::npos ? std::nullopt : ParseFinite(text.substr(at + 1));
+    if (!factor) return false;
+    const std::string name = text.substr(0, at);
+    for (std::size_t u = 0; u < tuned.Unknowns(); ++u) {
+        const std::string& whole = tuned.NameOf(u);
+        if (whole == name || whole.ends_with(" " + name)) return tuned.OnFactor(u, *factor) != 0;
+    }
+    return false;
+}
+
+EXIT_CODE Take(CUlfTuningDlg& tuned, const T_TUNE_OPTIONS& o)
+{
+    std::string names;
+    for (std::size_t u = 0; u < tuned.Unknowns(); ++u)
+        names += (names.empty() ? "" : ", ") + tuned.NameOf(u);
+    for (const std::string& factor : o.factors)
+        if (!TakeFactor(tuned, factor))
+            return Complain(EXIT_CODE::Usage,
+                            o.file + ": " + Say("IDS_QM_CLI_TUNE_BAD_FACTOR", factor, names));
+    return EXIT_CODE::Done;
+}
+
+EXIT_CODE Write(const CUlfTuningDlg& tuned, const T_TUNE_OPTIONS& o)
+{
+    EXIT_CODE code = EXIT_CODE::Done;
+    const T_TEXT_TABLE deck = tuned.DeckCells();
+    if (!o.deck.empty()) code = WriteOutput(o.deck, o.deck == "-" ? TextOf(deck) : TableCsv(deck));
+#ifdef QM_UI
+    if (code == EXIT_CODE::Done && !o.plot.empty())
+        code = WritePicture(TuningDisplacementPlot(tuned), o.plot);
+    if (code == EXIT_CODE::Done && !o.plotMoments.empty())
+        code = WritePicture(TuningMomentPlot(tuned), o.plotMoments);
+#endif
+    return code;
+}
+
+} // namespace
+
+EXIT_CODE RunUlfTune(const T_TUNE_OPTIONS& o)
+{
+    for (const std::string& plot : {o.plot, o.plotMoments})
+        if (const EXIT_CODE code = CheckPlotName(plot); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = CheckOutputs(o.file,
+                                            {{o.deck, OUTPUT_KIND::Text},
+                                             {o.plot, OUTPUT_KIND::Picture},
+                                             {o.plotMoments, OUTPUT_KIND::Picture}},
+                                            o.overwrite);
+        code != EXIT_CODE::Done)
+        return code;
+    CDBDoc doc;
+    if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
+    CUlfTuningDlg tuned(doc);
+    if (!tuned.OnOpen(o.item))
+        return Complain(EXIT_CODE::Usage, o.file + ": " + Say("IDS_QM_CLI_NO_ULF_ITEM", o.item));
+    if (!tuned.IsSolved()) (void)tuned.OnSolve({});
+    if (!tuned.IsSolved()) return Complain(EXIT_CODE::NotFound, o.file + ": " + tuned.StatusText());
+    if (const EXIT_CODE code = Take(tuned, o); code != EXIT_CODE::Done) return code;
+    if (const EXIT_CODE code = Write(tuned, o); code != EXIT_CODE::Done) return code;
+    if (o.deck != "-")
+        std::printf("%s\n\n%s\n%s", tuned.StatusText().c_str(), TextOf(tuned.StayCells()).c_str(),
+                    TextOf(tuned.ConstraintCells()).c_str());
+    return tuned.IsMet() ? EXIT_CODE::Done : EXIT_CODE::NotFound;
+}
