@@ -72,9 +72,11 @@ void AddCurves(CSharedCurves& curves, const T_PUSH_EVALUATION& e, T_PLOT_COLOR c
                PLOT_LINE::Solid, 2.6, color);
     const std::string demand = Say("IDS_QM_UI_PLOT_DEMAND") + ", " + e.eval.spectrum;
     if (e.stateDemands.empty()) curves.Add(demand, e.demand, PLOT_LINE::Solid, 1.4, color);
+    // Of several limit states that of the answer: all of them would hide what is compared.
+    const std::optional<T_EVALUATION_ANSWER> answer = AnswerOf(e);
     for (std::size_t i = 0; i < e.stateDemands.size(); ++i)
-        if (!e.stateDemands[i].Sd.empty())
-            curves.Add(demand + " " + kLimitStateNames[i], e.stateDemands[i], PLOT_LINE::Solid, 1.4,
+        if (answer && answer->state == kLimitStateNames[i])
+            curves.Add(demand + " " + answer->state, e.stateDemands[i], PLOT_LINE::Solid, 1.4,
                        color);
     curves.Add(Say("IDS_QM_UI_PLOT_REDUCED") + ", " + name, e.reduced, PLOT_LINE::Dash, 1.6, color);
     if (e.bilinear) {
