@@ -26,6 +26,8 @@ TEST(MessageAudit, FindsEachKindOfFault)
     } kCases[] = {
         {"sound", "IDS_A = {1} {2}", "IDS_A = {2} {1}", "f(\"IDS_A\");", {}},
         {"no text", "IDS_A = a", "IDS_A = a", "f(\"IDS_B\")", {"a.cpp: no text for IDS_B"}},
+        {"beginning of keys", "IDS_A_B = a", "IDS_A_B = a", "f(\"IDS_A_\" + x)", {}},
+        {"of none", "IDS_A = a", "IDS_A = a", "f(\"IDS_B_\" + x)", {"a.cpp: no text for IDS_B_"}},
         {"unknown", "IDS_A = a", "IDS_A = a\nIDS_C = c", "", {"it: unknown IDS_C"}},
         {"missing", "IDS_A = a\nIDS_B = b", "IDS_B = b", "", {"it: missing IDS_A"}},
         {"double it", "IDS_A = a", "IDS_A = a\nIDS_A = a", "", {"it line 2: IDS_A: stands twice"}},
