@@ -86,7 +86,7 @@ int WritePictures(const QCommandLineParser& parser, const T_PICTURE_ARGUMENTS& a
 int main(int argc, char** argv)
 {
     solver::StartLean(argv);
-    OffscreenScreen(argc, argv);
+    const COffscreenScreen screen(argc, argv);
     CApplication app(argc, argv);
     std::setlocale(LC_NUMERIC, "C"); // models write '.', whatever the locale of the windows is
     QCoreApplication::setOrganizationName("qm-rps");

@@ -3,20 +3,26 @@
 #include "mainwindow.h"
 #include "shell/theme.h"
 
+#include "qm_base/textformat.h"
+
 #include <QApplication>
 #include <QDir>
-#include <QFile>
 #include <QFileInfo>
 #include <QPixmap>
-#include <QRegularExpression>
 #include <QSettings>
 #include <QStandardPaths>
 #include <QTemporaryDir>
 
 #include <cstdio>
+#include <filesystem>
+#include <fstream>
 #include <string_view>
 
+#include <unistd.h>
+
 namespace {
+
+constexpr QSize kScreen{1920, 1080}; // where none is asked for
 
 /// Events until the window has got its layout.
 void Settle()
@@ -91,9 +97,26 @@ int WriteWindowPictures(const T_PICTURE_OPTIONS& options)
     return failed;
 }
 
-void OffscreenScreen(int argc, char** argv)
+COffscreenScreen::COffscreenScreen(int argc, char** argv)
 {
     if (ArgumentOf(argc, argv, "--pictures").isEmpty()) return;
-    const QString scale = ArgumentOf(argc, argv, "--scale");
-    if (!scale.isEmpty()) qputenv("QT_SCALE_FACTOR", scale.toLatin1());
+    const QStringList sides = ArgumentOf(argc, argv, "--size").split('x');
+    const int width = sides.value(0).toInt(), height = sides.value(1).toInt();
+    const double scale = ArgumentOf(argc, argv, "--scale").toDouble();
+    const std::string text =
+        FormatText("{\"screens\": [{\"name\": \"memory\", \"x\": 0, \"y\": 0, \"width\": %d, "
+                   "\"height\": %d, \"logicalDpi\": 96, \"logicalBaseDpi\": 96, \"dpr\": %g}]}",
+                   width > 0 ? width : kScreen.width(), height > 0 ? height : kScreen.height(),
+                   scale > 0.0 ? scale : 1.0);
+    m_file = (std::filesystem::temp_directory_path() /
+              ("qm-rps-screen-" + std::to_string(getpid()) + ".json"))
+                 .string();
+    std::ofstream(m_file) << text;
+    qputenv("QT_QPA_PLATFORM", QByteArray("offscreen:configfile=") + m_file.c_str());
+}
+
+COffscreenScreen::~COffscreenScreen()
+{
+    std::error_code ignored;
+    if (!m_file.empty()) std::filesystem::remove(m_file, ignored);
 }

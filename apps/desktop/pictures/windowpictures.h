@@ -26,7 +26,7 @@ struct T_WINDOW_EXAMPLE {
 };
 
 /// How pictures are made. Scale of the screen and its size are those that the program started with
-/// (see OffscreenScreen).
+/// (see COffscreenScreen).
 struct T_PICTURE_OPTIONS {
     QString folder;
     QString examples; // folder of the example models
@@ -40,9 +40,18 @@ struct T_PICTURE_OPTIONS {
 /// not be made; each is named on stderr.
 int WriteWindowPictures(const T_PICTURE_OPTIONS& options);
 
-/// To be called before the application is made: a screen in memory for these arguments
-/// (--scale 2, --size 1024x700), where --pictures is among them.
-void OffscreenScreen(int argc, char** argv);
+/// A screen in memory for these arguments (--scale 2, --size 1024x700) where --pictures is among
+/// them. It is made before the application, which takes it from a file that goes with this object.
+class COffscreenScreen {
+public:
+    COffscreenScreen(int argc, char** argv);
+    ~COffscreenScreen();
+    COffscreenScreen(const COffscreenScreen&) = delete;
+    COffscreenScreen& operator=(const COffscreenScreen&) = delete;
+
+private:
+    std::string m_file; // empty: none
+};
 
 /// The windows of all tools.
 std::vector<T_WINDOW_EXAMPLE> WindowExamples();
