@@ -188,7 +188,8 @@ TEST_F(Shell, DroppedFilesAreOpenedAndATableIsToldFromAModel)
     EXPECT_FALSE(Model().nodes.empty());
     data.setUrls({QUrl::fromLocalFile("/x/picture.png")});
     EXPECT_FALSE(drop());
-    if (m_main->Action("IDS_QM_UI_NEW_CURVE")) return; // the wizard takes tables
+    if (m_main->Action((std::string("IDS_QM_") + "NEW_CURVE_MENU").c_str()))
+        return; // the wizard takes tables
     data.setUrls({QUrl::fromLocalFile("/x/push.csv")});
     CAnswers answers({CAnswers::Accept()});
     EXPECT_TRUE(drop());

@@ -35,6 +35,9 @@
 
 namespace {
 
+// Commands that the program may have or not.
+const std::string kPrefix = "IDS_QM_", kCurveWizard = kPrefix + "NEW_CURVE_MENU",
+                  kFrameGuide = kPrefix + "NEW_FRAME_MENU";
 constexpr const char* kRecentKey = "recent"; // as the menu of recent files keeps them
 
 QString Text(const std::string& key)
@@ -122,8 +125,9 @@ void CShell::MakeStart()
         QSettings().setValue(kRecentKey, list);
     };
     calls.begin = [this] {
-        return std::vector<QAction*>{Named("IDS_QM_UI_NEW_CURVE"), Named("IDS_QM_UI_NEW_FRAME"),
-                                     Named("IDS_QM_UI_NEW"), Named("IDS_QM_UI_OPEN")};
+        return std::vector<QAction*>{m_window.Action(kCurveWizard.c_str()),
+                                     m_window.Action(kFrameGuide.c_str()), Named("IDS_QM_UI_NEW"),
+                                     Named("IDS_QM_UI_OPEN")};
     };
     m_stack = new QStackedWidget(&m_window);
     m_start = new CStartPage(std::move(calls), m_stack);
@@ -277,7 +281,7 @@ void CShell::TakeFile(const QString& path)
         (void)m_window.Open(path);
         return;
     }
-    if (QAction* wizard = Named("IDS_QM_UI_NEW_CURVE")) {
+    if (QAction* wizard = m_window.Action(kCurveWizard.c_str())) {
         m_window.setProperty("droppedCurve", path); // the wizard begins with it
         wizard->trigger();
         m_window.setProperty("droppedCurve", QVariant());
