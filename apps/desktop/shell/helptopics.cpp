@@ -88,7 +88,9 @@ QString TopicOf(const QWidget* focused)
     const QString title = focused->window()->windowTitle();
     for (const auto& [key, topic] : kTopics)
         if (title == QString::fromStdString(Say(key))) return topic;
-    return kDesktop;
+    // A section may have the title of the window that it explains.
+    const QString own = AnchorOf(title);
+    return own.isEmpty() || PageWith(own).isEmpty() ? QString(kDesktop) : own;
 }
 
 QStringList HelpTopics()

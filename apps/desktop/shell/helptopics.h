@@ -11,7 +11,7 @@ class QWidget;
 QString AnchorOf(const QString& heading);
 
 /// The anchor for a window by its title, or for a pane of the main window that has the focus;
-/// that of the desktop where the table knows no better.
+/// else the section with the title of the window, else that of the desktop.
 QString TopicOf(const QWidget* focused);
 
 /// All of them.

@@ -6,6 +6,7 @@
 
 #include <QEvent>
 #include <QImage>
+#include <QKeyEvent>
 #include <QPainter>
 #include <QToolButton>
 
@@ -69,6 +70,13 @@ bool CModelCard::event(QEvent* event)
     if (event->type() == QEvent::KeyPress && m_remove) {
         event->ignore(); // Tab goes on to the button
         return QWidget::event(event);
+    }
+    if (event->type() == QEvent::KeyPress) {
+        const int key = static_cast<QKeyEvent*>(event)->key();
+        if (key == Qt::Key_Return || key == Qt::Key_Enter) { // buttons take the space bar alone
+            click();
+            return true;
+        }
     }
     return QAbstractButton::event(event);
 }

@@ -131,6 +131,17 @@ public:
     }
 };
 
+QRgb TurnedPixel(QRgb pixel)
+{
+    const int r = qRed(pixel), g = qGreen(pixel), b = qBlue(pixel);
+    // Lightness of HSL is the mean of the largest and the smallest channel.
+    const int shift = 255 - std::max({r, g, b}) - std::min({r, g, b});
+    const auto turned = [shift](int channel) {
+        return kDarkGround + (channel + shift) * (255 - kDarkGround) / 255;
+    };
+    return qRgb(turned(r), turned(g), turned(b));
+}
+
 } // namespace
 
 bool IsDark()
@@ -161,16 +172,15 @@ void ApplyTheme(THEME theme)
 void TurnLightness(QImage& image)
 {
     image.convertTo(QImage::Format_ARGB32_Premultiplied);
-    const auto turned = [](int channel, int shift) {
-        return kDarkGround + (channel + shift) * (255 - kDarkGround) / 255;
-    };
+    QRgb before = 0xffffffff, after = TurnedPixel(before); // most pixels are as the one before
     for (int y = 0; y < image.height(); ++y) {
         auto* line = reinterpret_cast<QRgb*>(image.scanLine(y));
         for (int x = 0; x < image.width(); ++x) {
-            const int r = qRed(line[x]), g = qGreen(line[x]), b = qBlue(line[x]);
-            // Lightness of HSL is the mean of the largest and the smallest channel.
-            const int shift = 255 - std::max({r, g, b}) - std::min({r, g, b});
-            line[x] = qRgba(turned(r, shift), turned(g, shift), turned(b, shift), 255);
+            if (line[x] != before) {
+                before = line[x];
+                after = TurnedPixel(before);
+            }
+            line[x] = after;
         }
     }
 }
