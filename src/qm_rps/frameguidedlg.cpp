@@ -53,6 +53,11 @@ CFrameGuideDlg::CFrameGuideDlg(CDBDoc& doc)
     b.liveRoof = 4.0;
 }
 
+std::string CFrameGuideDlg::LineUnit() const
+{
+    return std::string(NameOf(Units().force)) + "/" + std::string(NameOf(Units().length));
+}
+
 int CFrameGuideDlg::ReadLists(T_BUILDING& out, T_FINDING& fault) const
 {
     T_BUILDING in = m_building;

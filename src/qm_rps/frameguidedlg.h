@@ -25,6 +25,7 @@ public:
     void OnChange() { m_isMade = m_isTried = false; }
     bool IsPlane() const { return m_baysY.empty(); }
     T_UNITS Units() const { return m_building.units; }
+    std::string LineUnit() const; // "kN/m"
 
     // ---- what follows ----
     /// The frame as it would be; empty while something is wrong.

@@ -80,6 +80,7 @@ TEST_F(NewWindows, AFrameIsMadeAndAnalysed)
         EXPECT_TRUE(IsMarked(w, "columns"));
         EXPECT_FALSE(IsMarked(w, "grade.columns"));
         Enter(w, "columns", "0.4x0.4");
+        EXPECT_EQ("Dead, floors (kN/m)", w.Form().Find("dead")->caption());
         EXPECT_EQ(5, Grid(w, "levels").Model().rowCount()); // ground, three storeys, sum
         EXPECT_TRUE(TextAt(w, "command").startsWith("qm-rps new frame"));
     };
@@ -132,4 +133,24 @@ TEST_F(NewWindows, StoreysAreMadeFromLevels)
     EXPECT_EQ("Roof", Model().storeys.at(3).name);
     EXPECT_EQ(before.at(3).nodes, Model().storeys.at(3).nodes);
     EXPECT_EQ(before.at(1), Model().storeys.at(1));
+}
+
+TEST_F(NewWindows, ModesAreTypedAndFound)
+{
+    ASSERT_TRUE(Open("space-frame-3d"));
+    const auto edit = [this](CDialogWindow& w) {
+        Enter(w, "count", "3");
+        Push(w, "find");
+        EXPECT_EQ(3, Grid(w, "modes").Model().rowCount());
+        Enter(w, "period", "0.9");
+        Enter(w, "shape", "0.3, 0.7, 1");
+        Push(w, "add");
+        EXPECT_EQ(4, Grid(w, "modes").Model().rowCount());
+        EXPECT_EQ(0.7, Model().modes.at(4).shape.at(205)[0]);
+    };
+    CAnswers answers({CAnswers::Fill(edit)});
+    Run("IDS_QM_MODES_MENU");
+    EXPECT_NEAR(0.780, Model().modes.at(1).period, 5e-4); // that of the example's README
+    Run("IDS_QM_UI_UNDO");
+    EXPECT_EQ(3U, Model().modes.size());
 }

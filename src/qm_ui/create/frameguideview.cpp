@@ -9,7 +9,6 @@
 namespace {
 
 using DLG = CFrameGuideDlg;
-constexpr T_DIM kLineLoad{1, -1};
 
 /// The frame as it would be.
 class CPreviewField : public CFormField {
@@ -46,10 +45,10 @@ struct T_ADD {
     {
         return Named(form.Text(Head(key, dim), Told(value, tell)), name);
     }
-    CFormField& Number(const char* key, double& value, const char* name,
-                       std::optional<T_DIM> dim = {})
+    CFormField& LineLoad(const char* key, double& value, const char* name)
     {
-        return Named(form.Number(Head(key, dim), Told(value, tell)), name);
+        const auto head = [this_ = &d, key] { return Say(key) + " (" + this_->LineUnit() + ")"; };
+        return Named(form.Number(head, Told(value, tell)), name);
     }
     TextFn Head(const char* key, std::optional<T_DIM> dim) const
     {
@@ -124,15 +123,16 @@ void AddLoads(T_ADD& add)
     T_BUILDING& b = add.d.m_building;
     add.form.Page(KeyText("IDS_QM_NEW_PAGE_LOADS"));
     add.form.Note(KeyText("IDS_QM_NEW_LOADS_HOW"));
-    add.Number("IDS_QM_NEW_DEAD", b.dead, "dead", kLineLoad);
-    add.Number("IDS_QM_NEW_LIVE", b.live, "live", kLineLoad);
-    add.Number("IDS_QM_NEW_DEAD_ROOF", b.deadRoof, "roofDead", kLineLoad);
-    add.Number("IDS_QM_NEW_LIVE_ROOF", b.liveRoof, "roofLive", kLineLoad);
+    add.LineLoad("IDS_QM_NEW_DEAD", b.dead, "dead");
+    add.LineLoad("IDS_QM_NEW_LIVE", b.live, "live");
+    add.LineLoad("IDS_QM_NEW_DEAD_ROOF", b.deadRoof, "roofDead");
+    add.LineLoad("IDS_QM_NEW_LIVE_ROOF", b.liveRoof, "roofLive");
     add.form
         .Choice(KeyText("IDS_QM_NEW_LOADED"), ToldIndex(b.loaded, add.tell),
                 KeyTexts({"IDS_QM_NEW_LOADED_ALL", "IDS_QM_NEW_LOADED_X", "IDS_QM_NEW_LOADED_Y"}))
         .name = "loaded";
-    add.Number("IDS_QM_NEW_LIVE_IN_MASS", b.liveInMass, "massLive");
+    add.form.Number(KeyText("IDS_QM_NEW_LIVE_IN_MASS"), Told(b.liveInMass, add.tell)).name =
+        "massLive";
     add.form.Integer(KeyText("IDS_QM_NEW_MODE_COUNT"), Told(add.d.m_modes, add.tell)).name =
         "modes";
     add.form.Flag(KeyText("IDS_QM_NEW_PUSH_CASES"), Told(add.d.m_push, add.tell)).name = "push";
