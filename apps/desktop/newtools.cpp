@@ -39,10 +39,20 @@ void NewFromCurve(T_DESKTOP& desktop)
     window.Form().Refresh();
 }
 
+/// Modes are found while a window shows how far they are.
+template <class DIALOG>
+void ShowProgress(T_DESKTOP& desktop, DIALOG& dialog)
+{
+    dialog.m_withProgress = [&desktop](const std::function<int(typename DIALOG::TELL_FN)>& work) {
+        return RunWithProgress(desktop.window, Text("IDS_QM_UI_ANALYSING"), work);
+    };
+}
+
 void NewFrame(T_DESKTOP& desktop)
 {
     CFrameGuideDlg dialog(desktop.doc);
     dialog.SetView(&desktop.view);
+    ShowProgress(desktop, dialog);
     dialog.m_mayReplace = [&desktop] { return desktop.frame.OnNew(); };
     (void)dialog.DoModal();
     desktop.changed();
@@ -53,6 +63,15 @@ void Edit(T_DESKTOP& desktop, KEY... key)
 {
     DIALOG dialog(desktop.doc, key...);
     dialog.SetView(&desktop.view);
+    (void)dialog.DoModal();
+    desktop.changed();
+}
+
+void EditModes(T_DESKTOP& desktop)
+{
+    CModesDlg dialog(desktop.doc);
+    dialog.SetView(&desktop.view);
+    ShowProgress(desktop, dialog);
     (void)dialog.DoModal();
     desktop.changed();
 }
@@ -100,8 +119,8 @@ T_COMMANDS PartCommands(T_DESKTOP& desktop)
     const auto hasNodes = [&desktop] { return !desktop.doc.Data().Model().nodes.empty(); };
     return {{"IDS_QM_UI_MENU_PUSHOVER", "IDS_QM_NEW_SPECTRUM_MENU", "",
              [&desktop] { Edit<CSpectrumDlg>(desktop, 0); }},
-            {"IDS_QM_UI_MENU_ANALYSIS", "IDS_QM_MODES_MENU", "",
-             [&desktop] { Edit<CModesDlg>(desktop); }, hasNodes},
+            {"IDS_QM_UI_MENU_ANALYSIS", "IDS_QM_MODES_MENU", "", [&desktop] { EditModes(desktop); },
+             hasNodes},
             {"IDS_QM_UI_MENU_EDIT", "IDS_QM_NEW_STOREYS_MENU", "",
              [&desktop] { Edit<CStoreyGuideDlg>(desktop); }, hasNodes}};
 }

@@ -170,8 +170,11 @@ int CFrameGuideDlg::FindModes()
     options.allCases = false;
     options.modes = m_modes;
     T_ANALYSIS_ERROR error;
-    const auto work = [&] { return m_doc.RunAnalysis(options, error); };
-    if (m_run ? m_run(work) : work()) return 1;
+    const auto work = [&](TELL_FN tell) {
+        options.progress = std::move(tell);
+        return m_doc.RunAnalysis(options, error);
+    };
+    if (m_withProgress ? m_withProgress(work) : work({})) return 1;
     ShowMessage("IDS_QM_NEW_NO_MODES", Say("IDS_QM_NEW_NO_MODES", error.text));
     return 0;
 }

@@ -39,8 +39,10 @@ public:
 
     /// Asked before the open model goes; 0: it stays. Set by the application.
     std::function<int()> m_mayReplace;
-    /// Runs an analysis where the application shows how far it is; empty: it just runs.
-    std::function<int(const std::function<int()>&)> m_run;
+    /// Runs work that tells parts done of a total and stops where that asks it to (false); set by
+    /// the application. Empty: it runs untold.
+    using TELL_FN = std::function<bool(std::size_t, std::size_t)>;
+    std::function<int(const std::function<int(TELL_FN)>&)> m_withProgress;
     /// Puts the frame into the document in place of what it has, finds its modes and makes its load
     /// cases. 0: refused with a message; where modes or load cases can't be had, the frame stays
     /// and a message says why.

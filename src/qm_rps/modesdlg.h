@@ -15,8 +15,10 @@ public:
 
     int m_count = 6; // that the analysis finds
 
-    /// Runs the analysis where the application shows how far it is; empty: it just runs.
-    std::function<int(const std::function<int()>&)> m_run;
+    /// Runs work that tells parts done of a total and stops where that asks it to (false); set by
+    /// the application. Empty: it runs untold.
+    using TELL_FN = std::function<bool(std::size_t, std::size_t)>;
+    std::function<int(const std::function<int(TELL_FN)>&)> m_withProgress;
     /// Finds modes, which take the place of all that the model has, as an edit that can be undone.
     /// 0 with a message.
     int OnFind();
