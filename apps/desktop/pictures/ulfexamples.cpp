@@ -106,7 +106,10 @@ WINDOW TuningWindow(CMainWindow& main)
     auto tuned = std::make_unique<CUlfTuningDlg>(main.Doc());
     if (!tuned->OnSolve({}) || !tuned->OnFactor(2, 1.1 * tuned->Factor(2))) return nullptr;
     tuned->m_chosen = 2;
-    return WindowOf(main, std::move(tuned));
+    WINDOW window = WindowOf(main, std::move(tuned));
+    window->show();
+    window->resize(1320, 780);
+    return window;
 }
 
 WINDOW StepWindow(CMainWindow& main)

@@ -153,28 +153,46 @@ void BuildAdditional(CFormView& form, MODEL& m)
         [&m] { m.OnRemovePoint(m.m_pointRow); }, "Point");
 }
 
-void BuildButtons(CFormView& form, MODEL& m)
+struct T_DESK_BUTTON {
+    const char* key;
+    const char* name;
+    std::function<void()> run;
+};
+
+/// Side by side, two in a row.
+void AddButtons(CFormView& form, std::span<const T_DESK_BUTTON> buttons)
 {
-    struct T_BUTTON {
-        const char* key;
-        const char* name;
-        std::function<void()> run;
-    };
-    QWidget* const host = form.Host();
-    const T_BUTTON buttons[] = {
+    for (std::size_t i = 0; i < buttons.size(); i += 2) {
+        form.Columns(1);
+        form.Button(KeyText(buttons[i].key), buttons[i].run).name = buttons[i].name;
+        if (i + 1 < buttons.size()) {
+            form.NextColumn(1);
+            form.Button(KeyText(buttons[i + 1].key), buttons[i + 1].run).name = buttons[i + 1].name;
+        }
+        form.EndColumns();
+    }
+}
+
+/// What can be done with the chosen evaluation.
+void BuildOperations(CFormView& form, MODEL& m)
+{
+    const T_DESK_BUTTON buttons[] = {
         {"IDS_QM_UI_PUSH_POINTS_HINGES", "hinges", [&m] { (void)m.OnHinges(); }},
         {"IDS_QM_UI_JUDGE", "judge", [&m] { (void)m.OnJudge(); }},
         {"IDS_QM_UI_PUSH_REPORT", "report", [&m] { m.OnPushoverCurveTextout(); }},
         {"IDS_QM_UI_PUSH_CURVE_FILE", "curveFile", [&m] { m.OnCurveText(); }},
-        {"IDS_QM_EVAL_COPY_TABLE", "copyTable", [host] { CopyTable(host); }},
-        {"IDS_QM_EVAL_SAVE_TABLE", "saveTable", [host, &m] { SaveTable(host, m); }},
         {"IDS_QM_UI_PUSH_COMPARE", "compare", [&m] { m.OnCompare(); }}};
-    form.Columns();
-    for (const T_BUTTON& button : buttons) {
-        if (&button != buttons) form.NextColumn();
-        form.Button(KeyText(button.key), button.run).name = button.name;
-    }
-    form.EndColumns();
+    AddButtons(form, buttons);
+}
+
+/// For the table that is in front.
+void BuildTableButtons(CFormView& form, MODEL& m)
+{
+    QWidget* const host = form.Host();
+    const T_DESK_BUTTON buttons[] = {
+        {"IDS_QM_EVAL_COPY_TABLE", "copyTable", [host] { CopyTable(host); }},
+        {"IDS_QM_EVAL_SAVE_TABLE", "saveTable", [host, &m] { SaveTable(host, m); }}};
+    AddButtons(form, buttons);
 }
 
 /// What was asked for, and what an engineer should know about it.
@@ -240,6 +258,7 @@ void BuildEvaluationDesk(CFormView& form, CEvaluationDeskDlg& m)
     form.Columns();
     BuildEvaluations(form, m);
     BuildEvaluationSettings(form, m);
+    BuildOperations(form, m);
     form.NextColumn(1);
     BuildInputs(form, m);
     form.Page(KeyText("IDS_QM_EVAL_EVALUATION"));
@@ -255,7 +274,7 @@ void BuildEvaluationDesk(CFormView& form, CEvaluationDeskDlg& m)
     BuildTables(form, m);
     BuildComparison(form, m);
     form.EndPages();
-    BuildButtons(form, m);
+    BuildTableButtons(form, m);
     form.EndColumns();
     LimitHeight(*form.Find("facts")->widget, *form.Find("plot")->widget->parentWidget());
 }

@@ -50,7 +50,7 @@ public:
         : m_desk(desk), m_list(new QListWidget(parent))
     {
         widget = m_list;
-        m_list->setMinimumSize(300, 120);
+        m_list->setMinimumSize(250, 120);
         m_list->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOff);
         m_list->setSpacing(1);
         QObject::connect(m_list, &QListWidget::currentRowChanged, [this, changed](int row) {
@@ -121,6 +121,7 @@ public:
         widget = new QWidget(parent);
         auto* row = new QHBoxLayout(widget);
         row->setContentsMargins(0, 0, 0, 0);
+        row->setSpacing(4);
         m_verdict = new QLabel(widget);
         row->addWidget(m_verdict);
         m_why = new QLabel(widget);
@@ -129,14 +130,13 @@ public:
         for (T_CARD_LABELS& card : m_cards) {
             card.box = new QWidget(widget);
             auto* column = new QVBoxLayout(card.box);
-            column->setContentsMargins(6, 0, 6, 0);
+            column->setContentsMargins(2, 0, 2, 0);
             column->setSpacing(0);
             card.symbol = new QLabel(card.box);
             card.value = new QLabel(card.box);
-            QFont large = card.value->font();
-            large.setPointSizeF(1.15 * large.pointSizeF());
-            large.setBold(true);
-            card.value->setFont(large);
+            QFont bold = card.value->font();
+            bold.setBold(true);
+            card.value->setFont(bold);
             card.value->setTextInteractionFlags(Qt::TextSelectableByMouse);
             column->addWidget(card.symbol);
             column->addWidget(card.value);

@@ -20,8 +20,14 @@ constexpr std::array<T_PLOT_COLOR, 7> kColors{{{0, 114, 178},
 constexpr double kRoom = 1.12; // beyond the largest value
 
 /// By EVALUATION_VERDICT.
-constexpr std::array<T_PLOT_COLOR, 6> kVerdictColors{
-    {{27, 120, 55}, {190, 30, 30}, {190, 90, 0}, {95, 100, 110}, {140, 70, 140}, {140, 70, 140}}};
+constexpr std::array<T_PLOT_COLOR, 7> kVerdictColors{{{27, 120, 55},
+                                                      {0, 110, 130},
+                                                      {190, 30, 30},
+                                                      {190, 90, 0},
+                                                      {95, 100, 110},
+                                                      {140, 70, 140},
+                                                      {140, 70, 140}}};
+static_assert(kVerdictColors.size() == static_cast<std::size_t>(EVALUATION_VERDICT::Refused) + 1);
 
 /// Draws a curve unless an evaluation before had the same one, whose line then stands for both.
 class CSharedCurves {
@@ -44,7 +50,14 @@ private:
 void AddAnswer(T_PLOT& plot, const T_PUSH_EVALUATION& e, T_PLOT_COLOR color)
 {
     const std::optional<T_EVALUATION_ANSWER> answer = AnswerOf(e);
-    if (!answer) return;
+    if (!answer) { // the legend says that it has none
+        T_PLOT_SERIES none;
+        none.name = e.eval.name + ": " + VerdictText(EVALUATION_VERDICT::NoPoint);
+        none.color = color;
+        none.line = PLOT_LINE::Solid;
+        plot.series.push_back(std::move(none));
+        return;
+    }
     const std::string name =
         e.eval.name + (answer->state.empty() ? "" : " (" + answer->state + ")");
     if (!answer->Sa) {
@@ -65,24 +78,25 @@ void AddAnswer(T_PLOT& plot, const T_PUSH_EVALUATION& e, T_PLOT_COLOR color)
                            PLOT_MARKER::None, true});
 }
 
+/// The legend has one entry for each evaluation and each capacity; what the other lines are says
+/// the subtitle.
 void AddCurves(CSharedCurves& curves, const T_PUSH_EVALUATION& e, T_PLOT_COLOR color)
 {
-    const std::string& name = e.eval.name;
+    const auto line = [&](const T_ADRS_CURVE& curve, PLOT_LINE dash) {
+        curves.Add({}, curve, dash, 1.5, color);
+    };
     curves.Add(Say("IDS_QM_UI_PLOT_CAPACITY") + ", " + ShownPushName(e), e.capacity,
                PLOT_LINE::Solid, 2.6, color);
-    const std::string demand = Say("IDS_QM_UI_PLOT_DEMAND") + ", " + e.eval.spectrum;
-    if (e.stateDemands.empty()) curves.Add(demand, e.demand, PLOT_LINE::Solid, 1.4, color);
+    if (e.stateDemands.empty()) line(e.demand, PLOT_LINE::Solid);
     // Of several limit states that of the answer: all of them would hide what is compared.
     const std::optional<T_EVALUATION_ANSWER> answer = AnswerOf(e);
     for (std::size_t i = 0; i < e.stateDemands.size(); ++i)
         if (answer && answer->state == kLimitStateNames[i])
-            curves.Add(demand + " " + answer->state, e.stateDemands[i], PLOT_LINE::Solid, 1.4,
-                       color);
-    curves.Add(Say("IDS_QM_UI_PLOT_REDUCED") + ", " + name, e.reduced, PLOT_LINE::Dash, 1.6, color);
+            line(e.stateDemands[i], PLOT_LINE::Solid);
+    line(e.reduced, PLOT_LINE::Dash);
     if (e.bilinear) {
         const T_BILINEAR& b = *e.bilinear;
-        curves.Add(Say("IDS_QM_UI_PLOT_BILINEAR") + ", " + name,
-                   {{0.0, b.dy, b.du}, {0.0, b.ay, b.au}}, PLOT_LINE::DashDot, 1.6, color);
+        line({{0.0, b.dy, b.du}, {0.0, b.ay, b.au}}, PLOT_LINE::DashDot);
     }
 }
 
@@ -117,6 +131,7 @@ T_PLOT OverlayPlot(std::span<const T_PUSH_EVALUATION* const> evaluations,
     T_PLOT plot;
     if (evaluations.empty()) return plot;
     plot.title = Say("IDS_QM_EVAL_OVERLAY", std::to_string(evaluations.size()));
+    plot.subtitle = Say("IDS_QM_EVAL_OVERLAY_LINES");
     plot.x.title = Say("IDS_PUSHOVER_Spectral_Displ_") + " (" +
                    std::string(NameOf(evaluations.front()->units.length)) + ")";
     plot.y.title = Say("IDS_PUSHOVER_Spectral_Accel__g_");

@@ -53,6 +53,10 @@ T_PLOT TuningMomentPlot(const CUlfTuningDlg& tuned)
     const T_UNITS units = tuned.Units();
     const std::string unit =
         std::string(NameOf(units.force)) + " " + std::string(NameOf(units.length));
-    return DeckPlot("IDS_QM_TUNE_MOMENT", unit, tuned, tuned.Deck().moments,
-                    &CUlfDeckValues::T_VALUES::moments);
+    const std::vector<T_DECK_STATION>& at = tuned.Deck().moments;
+    T_PLOT plot =
+        DeckPlot("IDS_QM_TUNE_MOMENT", unit, tuned, at, &CUlfDeckValues::T_VALUES::moments);
+    constexpr int kMomentY = 5;
+    if (!at.empty()) plot.subtitle = at.front().what.component == kMomentY ? "My" : "Mz";
+    return plot;
 }

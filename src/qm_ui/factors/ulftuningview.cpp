@@ -99,9 +99,9 @@ void BuildTuning(CFormView& form, TUNED& tuned, const T_ULF_HOOKS& hooks)
     tuned.m_changed = [&form] { form.Refresh(); };
     AddHead(form, tuned, hooks);
     form.Columns();
-    AddUlfGrid(form, StayGrid(tuned), {480, 200}).name = "stays";
+    AddUlfGrid(form, StayGrid(tuned), {620, 200}).name = "stays";
     AddFactor(form, tuned);
-    AddUlfGrid(form, GridOf([&tuned] { return tuned.ConstraintCells(); }), {480, 200}).name =
+    AddUlfGrid(form, GridOf([&tuned] { return tuned.ConstraintCells(); }), {620, 200}).name =
         "constraints";
     form.NextColumn(1);
     form.Picture([&tuned] { return TuningDisplacementPlot(tuned); }).name = "deck";
@@ -115,7 +115,7 @@ void RegisterUlfTuningView(CViewFactory& factory, const T_ULF_HOOKS& hooks)
 {
     T_VIEW view;
     view.showsOnly = true;
-    view.size = {1240, 780};
+    view.size = {1320, 780};
     view.closes = [](zql::frx::MDialog& model) { return dynamic_cast<TUNED&>(model).OnClose(); };
     factory.Register<TUNED>(
         KeyText("IDS_QM_TUNE_TITLE"),

@@ -56,9 +56,9 @@ std::optional<double> DriftAt(CDBDoc& doc, const T_PUSH_EVALUATION& e)
     return std::lerp(std::fabs(*before), std::fabs(*after), at->second);
 }
 
-constexpr const char* kVerdictKeys[] = {"IDS_QM_EVAL_OK",        "IDS_QM_EVAL_NG",
-                                        "IDS_QM_EVAL_BEYOND",    "IDS_QM_EVAL_NOT_CHECKED",
-                                        "IDS_QM_EVAL_NOT_FOUND", "IDS_QM_EVAL_REFUSED"};
+constexpr const char* kVerdictKeys[] = {
+    "IDS_QM_EVAL_OK",          "IDS_QM_EVAL_PARTLY",    "IDS_QM_EVAL_NG",     "IDS_QM_EVAL_BEYOND",
+    "IDS_QM_EVAL_NOT_CHECKED", "IDS_QM_EVAL_NOT_FOUND", "IDS_QM_EVAL_REFUSED"};
 
 bool HasRemark(const T_PUSH_EVALUATION& e, std::initializer_list<const char*> remarks)
 {
@@ -74,6 +74,15 @@ std::string StatesWith(const T_PUSH_EVALUATION& e, std::initializer_list<const c
     for (const T_LIMIT_ROW& row : e.limitStates)
         if (std::ranges::find(remarks, row.remark) != remarks.end())
             names += (names.empty() ? "" : ", ") + row.name;
+    return names;
+}
+
+/// Names of the limit states whose demand is compared with nothing.
+std::string StatesNotCompared(const T_PUSH_EVALUATION& e)
+{
+    std::string names;
+    for (const T_LIMIT_ROW& row : e.limitStates)
+        if (row.demand && row.remark.empty()) names += (names.empty() ? "" : ", ") + row.name;
     return names;
 }
 
@@ -138,7 +147,8 @@ EVALUATION_VERDICT VerdictOf(const T_EVALUATION_ENTRY& entry)
     if (e.Status() == kBeyondPush) return V::BeyondPush;
     if (HasRemark(e, {"NG", "N/A"})) return V::NotGood;
     if (HasRemark(e, {kNotChecked})) return V::NotChecked;
-    return HasRemark(e, {"OK"}) ? V::Ok : V::NotChecked;
+    if (!HasRemark(e, {"OK"})) return V::NotChecked;
+    return StatesNotCompared(e).empty() ? V::Ok : V::PartlyOk;
 }
 
 std::string VerdictText(EVALUATION_VERDICT verdict)
@@ -158,6 +168,8 @@ std::string VerdictReason(const T_EVALUATION_ENTRY& entry)
         return Say("IDS_QM_EVAL_WHY_BEYOND");
     case EVALUATION_VERDICT::NotGood:
         return Say("IDS_QM_EVAL_WHY_NG", StatesWith(e, {"NG", "N/A"}));
+    case EVALUATION_VERDICT::PartlyOk:
+        return Say("IDS_QM_EVAL_WHY_PARTLY", StatesWith(e, {"OK"}), StatesNotCompared(e));
     case EVALUATION_VERDICT::Ok:
         return Say("IDS_QM_EVAL_WHY_OK", StatesWith(e, {"OK"}));
     default:

@@ -8,7 +8,8 @@
 #include <span>
 
 /// What an evaluation says of the structure. A performance point alone is no verdict on it.
-enum class EVALUATION_VERDICT { Ok, NotGood, BeyondPush, NotChecked, NoPoint, Refused };
+/// PartlyOk: nothing is missed, but states with a demand have no capacity to compare it with.
+enum class EVALUATION_VERDICT { Ok, PartlyOk, NotGood, BeyondPush, NotChecked, NoPoint, Refused };
 
 struct T_EVALUATION_ENTRY {
     T_EVAL_D eval;            // as asked for
