@@ -124,6 +124,25 @@ TEST_F(Shell, EveryMenuHasWordsTipsAndKeysOfItsOwnInBothLanguages)
     m_main->SetLanguage("en");
 }
 
+TEST_F(Shell, MenusStandInTheOrderOfTheWork)
+{
+    QStringList titles;
+    for (const QMenu* menu : MenusOf(*m_main))
+        titles << menu->title().remove('&');
+    QStringList wanted{"File",     "Edit",         "Model",   "Loads", "Analysis", "Hinges",
+                       "Pushover", "Load factors", "Results", "View",  "Window",   "Help"};
+    if (!titles.contains("Loads")) wanted.removeAll("Loads"); // of a tool that may be missing
+    EXPECT_EQ(wanted, titles);
+    const std::pair<const char*, const char*> places[] = {{"IDS_QM_UI_SECT_MENU", "Model"},
+                                                          {"IDS_QM_UI_PUSH_STATES", "Results"},
+                                                          {"IDS_QM_UI_MESSAGES", "Window"},
+                                                          {"IDS_QM_UI_PREFERENCES", "Edit"}};
+    for (const auto& [key, title] : places) {
+        const auto menu = MenusOf(*m_main).at(static_cast<std::size_t>(titles.indexOf(title)));
+        EXPECT_TRUE(menu->actions().contains(m_main->Action(key))) << key;
+    }
+}
+
 TEST_F(Shell, AnExampleOpensAsACopyWhoseFileIsNeverWritten)
 {
     ASSERT_TRUE(m_main->Shell().IsAtStart());
