@@ -4,6 +4,7 @@
 #include "ratios.h"
 
 #include <QApplication>
+#include <QMouseEvent>
 #include <QPainter>
 #include <QPixmap>
 #include <benchmark/benchmark.h>
@@ -15,16 +16,17 @@
 
 namespace {
 
-constexpr int kBays = 25, kDeep = 25, kStoreys = 11; // 20,436 elements
+/// A frame of so many bays and storeys.
+struct T_SIZE {
+    int bays, deep, storeys;
+    int NodeAt(int x, int y, int z) const { return 1 + x + (bays + 1) * (y + (deep + 1) * z); }
+};
+constexpr T_SIZE kSlider{25, 25, 11}; // 20,436 elements
+constexpr T_SIZE kOrbit{41, 40, 10};  // 50,830 elements
 constexpr int kSteps = 20;
 
-int NodeAt(int x, int y, int z)
-{
-    return 1 + x + (kBays + 1) * (y + (kDeep + 1) * z);
-}
-
 /// A space frame of columns and beams with a pushover along X.
-T_MODEL_CONTENT Content()
+T_MODEL_CONTENT Content(const T_SIZE& size)
 {
     T_MODEL_CONTENT content;
     T_MODEL& model = content.model;
@@ -37,38 +39,39 @@ T_MODEL_CONTENT Content()
         e.nodeJ = j;
         model.elements[id] = e;
     };
-    for (int z = 0; z <= kStoreys; ++z)
-        for (int y = 0; y <= kDeep; ++y)
-            for (int x = 0; x <= kBays; ++x) {
+    for (int z = 0; z <= size.storeys; ++z)
+        for (int y = 0; y <= size.deep; ++y)
+            for (int x = 0; x <= size.bays; ++x) {
                 T_NODE_D node;
-                node.id = NodeAt(x, y, z);
+                node.id = size.NodeAt(x, y, z);
                 node.xyz = {6.0 * x, 6.0 * y, 3.0 * z};
                 if (z == 0) node.restraint = {1, 1, 1, 1, 1, 1};
                 model.nodes[node.id] = node;
-                if (z > 0) add(NodeAt(x, y, z - 1), node.id);
-                if (z > 0 && x > 0) add(NodeAt(x - 1, y, z), node.id);
-                if (z > 0 && y > 0) add(NodeAt(x, y - 1, z), node.id);
+                if (z > 0) add(size.NodeAt(x, y, z - 1), node.id);
+                if (z > 0 && x > 0) add(size.NodeAt(x - 1, y, z), node.id);
+                if (z > 0 && y > 0) add(size.NodeAt(x, y - 1, z), node.id);
                 for (int s = 1; s <= kSteps; ++s)
                     result.displacement[node.id].push_back(0.001 * s * z);
             }
     result.loadFactor.assign(kSteps, 1.0);
     result.baseReaction.assign(kSteps, 1.0);
     model.pushovers[1].name = "X";
-    model.pushovers[1].controlNode = NodeAt(0, 0, kStoreys);
+    model.pushovers[1].controlNode = size.NodeAt(0, 0, size.storeys);
     content.results[1] = MakePushResult(std::move(result));
     return content;
 }
 
-/// The pane with 20,000 elements.
+/// The pane with a large frame.
 struct T_BENCH {
     CDBDoc doc;
     CFrameScene scene{doc};
+    CSelection selection;
     std::unique_ptr<CFramePane> pane;
-    T_BENCH()
+    explicit T_BENCH(const T_SIZE& size)
     {
         NeedBenchApp();
-        doc.Data().Assign(Content());
-        pane = std::make_unique<CFramePane>(doc, scene);
+        doc.Data().Assign(Content(size));
+        pane = std::make_unique<CFramePane>(doc, scene, selection);
         pane->resize(1000, 760);
         pane->show();
         QApplication::processEvents();
@@ -78,7 +81,7 @@ struct T_BENCH {
 
 void FrameStep(benchmark::State& state)
 {
-    T_BENCH bench;
+    T_BENCH bench(kSlider);
     CFramePane& pane = *bench.pane;
     int step = 1;
     for (auto _ : state) {
@@ -89,10 +92,38 @@ void FrameStep(benchmark::State& state)
     if (bench.scene.Scene().lines.size() < 20000) state.SkipWithError("not enough elements");
 }
 
+/// The mouse turns the frame by a pixel, and it is drawn: without displacements, and displaced over
+/// the frame as it was. Items a second are frames.
+void Orbit(benchmark::State& state, bool displaced, bool perspective)
+{
+    T_BENCH bench(kOrbit);
+    CFrameView& view = bench.pane->View();
+    if (!displaced) (void)bench.pane->Show(bench.pane->Sources().front(), 1);
+    T_CAMERA camera = view.Camera();
+    camera.perspective = perspective;
+    view.SetCamera(camera);
+    view.repaint();
+    const auto mouse = [&](QEvent::Type type, double x) {
+        const QPointF at(x, 300.0);
+        QMouseEvent event(type, at, view.mapToGlobal(at), Qt::LeftButton, Qt::LeftButton, {});
+        QCoreApplication::sendEvent(&view, &event);
+    };
+    double x = 100.0;
+    mouse(QEvent::MouseButtonPress, x);
+    const double yaw = view.Camera().yawDeg;
+    for (auto _ : state) {
+        mouse(QEvent::MouseMove, x += 1.0);
+        view.repaint();
+    }
+    state.SetItemsProcessed(state.iterations());
+    if (bench.scene.Scene().lines.size() < 50000) state.SkipWithError("not enough elements");
+    if (view.Camera().yawDeg == yaw) state.SkipWithError("it does not turn");
+}
+
 /// The same lines on a picture of the same size, places given.
 void FrameLinesOnce(benchmark::State& state)
 {
-    T_BENCH bench;
+    T_BENCH bench(kSlider);
     const T_FRAME_SCENE& scene = bench.scene.Scene();
     std::vector<QLineF> lines;
     const double rad = std::acos(-1.0) / 4.0, px = 3.2;
@@ -134,6 +165,9 @@ void EmptyWindowStart(benchmark::State& state)
 }
 
 BENCHMARK(FrameStep)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(Orbit, Still, false, false)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(Orbit, Displaced, true, false)->Unit(benchmark::kMillisecond);
+BENCHMARK_CAPTURE(Orbit, Perspective, true, true)->Unit(benchmark::kMillisecond);
 BENCHMARK(FrameLinesOnce)->Unit(benchmark::kMillisecond);
 BENCHMARK(DesktopStart)->Unit(benchmark::kMillisecond)->UseRealTime();
 BENCHMARK(EmptyWindowStart)->Unit(benchmark::kMillisecond)->UseRealTime();

@@ -7,7 +7,7 @@
 
 namespace {
 
-constexpr int kParts = 16;               // of a member whose diagram is curved
+constexpr int kParts = 32;               // of a member whose diagram is curved
 constexpr std::size_t kManyLines = 4000; // more than so many have fewer parts
 constexpr double kNothing = 1e-9;        // of the largest force, or moment
 
@@ -87,17 +87,6 @@ std::span<const T_LINE_LOAD> LoadsAt(const std::vector<std::vector<T_LINE_LOAD>>
     return all[static_cast<std::size_t>(element)];
 }
 
-/// Rotations of the member's ends: those of the nodes with what hinges have flowed between.
-void TakeHinges(const T_HINGE_TURNS& turns, int element, T_LINE_ENDS& ends)
-{
-    const auto found = turns.find(element);
-    if (found == turns.end()) return;
-    for (const std::size_t k : {0U, 1U}) {
-        ends.moved.I[4 + k] += found->second.I[k];
-        ends.moved.J[4 + k] -= found->second.J[k];
-    }
-}
-
 /// From node I to node J: the rigid offsets go straight.
 void AddBent(const CDeflectedLine& bent, const T_MEMBER_AXES& axes, double toSi,
              std::vector<std::array<double, 3>>& out)
@@ -109,6 +98,33 @@ void AddBent(const CDeflectedLine& bent, const T_MEMBER_AXES& axes, double toSi,
 }
 
 } // namespace
+
+T_HINGE_TURNS HingeTurnsOf(const T_PUSH_RUN& run, int step)
+{
+    constexpr double kAtEnd = 1e-6; // of the length
+    T_HINGE_TURNS out;
+    for (std::size_t h = 0; h < run.hinges.size(); ++h) {
+        const T_PUSH_HINGE_SERIES& hinge = run.hinges[h];
+        const bool y = hinge.place.component == HINGE_COMPONENT::My;
+        if (!y && hinge.place.component != HINGE_COMPONENT::Mz) continue;
+        const double at = run.data.hinges[h].at;
+        if (at > kAtEnd && at < 1.0 - kAtEnd) continue;
+        T_ENDS<std::array<double, 2>>& turns = out[hinge.place.element];
+        (at < 0.5 ? turns.I : turns.J)[y ? 0 : 1] +=
+            hinge.deformation[static_cast<std::size_t>(step - 1)];
+    }
+    return out;
+}
+
+void TakeHinges(const T_HINGE_TURNS& turns, int element, T_LINE_ENDS& ends)
+{
+    const auto found = turns.find(element);
+    if (found == turns.end()) return;
+    for (const std::size_t k : {0U, 1U}) {
+        ends.moved.I[4 + k] += found->second.I[k];
+        ends.moved.J[4 + k] -= found->second.J[k];
+    }
+}
 
 double T_DIAGRAM::Size() const
 {

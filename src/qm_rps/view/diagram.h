@@ -1,6 +1,7 @@
 // Internal forces along members as a picture shows them, and members as they are bent.
 #pragma once
 
+#include "qm_rps/push/pushrun.h"
 #include "qm_rps/view/viewresults.h"
 
 enum class MEMBER_FORCE { N, Vy, Vz, T, My, Mz };
@@ -46,14 +47,20 @@ struct T_BENT_LINES {
     std::size_t parts = 0; // 0: none, lines are straight
     std::vector<std::array<double, 3>> moved;
 };
-inline constexpr std::size_t kBentParts = 16;
+inline constexpr std::size_t kBentParts = 32;
 /// Up to so many lines are drawn bent; what moves more is drawn straight, and said so.
 inline constexpr std::size_t kBentLines = 8000;
 
+/// What the hinges at the ends of members have flowed, by element: about y and z.
+using T_HINGE_TURNS = std::map<int, T_ENDS<std::array<double, 2>>>;
+/// Of a step, from 1; hinges along members are left out.
+[[nodiscard]] T_HINGE_TURNS HingeTurnsOf(const T_PUSH_RUN& run, int step);
+/// From the rotations of the nodes to those of the member's ends, behind the hinges.
+void TakeHinges(const T_HINGE_TURNS& turns, int element, T_LINE_ENDS& ends);
+
 /// With the forces of an analysis exact along prismatic beams; without (pushes, modes) by the
-/// cubic of the ends' displacements, the flow of hinges at the ends taken off (`hingeTurns`).
+/// cubic of the ends' displacements behind the hinges.
 /// dim: kDimLength, or kDimNone where the movements are those of a mode.
-using T_HINGE_TURNS = std::map<int, T_ENDS<std::array<double, 2>>>; // by element: about y, z
 [[nodiscard]] T_BENT_LINES BentLinesOf(const CViewFrame& frame, const T_FRAME_SCENE& scene,
                                        const T_VIEW_RESULTS& results,
                                        const solver::T_LOAD_CASE& loads, const T_UNITS& units,

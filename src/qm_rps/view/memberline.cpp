@@ -104,17 +104,25 @@ bool CMemberLine::FitTo(const T_ELEM_FORCES& analysed)
     return same;
 }
 
-/// Where the slope changes its sign: of a moment that is where the shear does, found between the
-/// stations by halving.
+/// Where the slope changes its sign, found between the stations by halving. Between them that of a
+/// moment is the shear, unless something was added to either.
 void CMemberLine::AddExtremes(std::size_t component, std::vector<double>& stations) const
 {
     constexpr int kHalvings = 60;
     const CMacaulay& force = m_force[component];
     const double step = 1e-6 * m_length;
-    const auto slope = [&](double x) { return force.At(x + step) - force.At(x - step); };
+    const auto rise = [&](double x) { return force.At(x + step) - force.At(x - step); };
+    const CMacaulay& shear = m_force[component == 4 ? 2 : 1];
+    const double sign = component == 4 ? 1.0 : -1.0;
+    const auto isShear = [&](double x) {
+        const double byShear = 2.0 * step * sign * shear.At(x);
+        return component >= 4 && std::fabs(rise(x) - byShear) <= 1e-3 * std::fabs(byShear);
+    };
     const std::size_t count = stations.size();
     for (std::size_t i = 0; i + 1 < count; ++i) {
         double a = stations[i] + 2.0 * step, b = stations[i + 1] - 2.0 * step;
+        const bool sheared = isShear(a) && isShear(b);
+        const auto slope = [&](double x) { return sheared ? sign * shear.At(x) : rise(x); };
         const double atA = slope(a);
         if (!(b > a) || atA * slope(b) >= 0.0) continue;
         for (int n = 0; n < kHalvings; ++n) {

@@ -184,7 +184,8 @@ void CResultView::ReadMoves(const T_VIEW_RESULTS& results, const solver::T_LOAD_
         m_missing = m_source.Error();
     if (!m_hasMoves || !hasFrame || !Moves()) return;
     m_bent = BentLinesOf(m_frame, *m_scene, results, loads, m_doc.Unit().Units(),
-                         source.kind == S::KIND::Mode ? kDimNone : kDimLength, HingeTurns());
+                         source.kind == S::KIND::Mode ? kDimNone : kDimLength,
+                         m_hingeMarks ? HingeTurnsOf(m_hinges.Run(), m_step) : T_HINGE_TURNS{});
 }
 
 void CResultView::ReadQuantity(const T_VIEW_RESULTS& results, const solver::T_LOAD_CASE& loads)
@@ -213,26 +214,6 @@ void CResultView::ReadQuantity(const T_VIEW_RESULTS& results, const solver::T_LO
     } else if (!m_hasMoves && m_missing.empty() && Source().kind != S::KIND::None) {
         m_missing = Say("IDS_QM_VIEW_NOT_ANALYSED");
     }
-}
-
-/// What has flowed at the ends of members: between node and member.
-T_HINGE_TURNS CResultView::HingeTurns() const
-{
-    constexpr double kAtEnd = 1e-6; // of the length
-    T_HINGE_TURNS out;
-    if (!m_hingeMarks) return out;
-    const T_PUSH_RUN& run = m_hinges.Run();
-    for (std::size_t h = 0; h < run.hinges.size(); ++h) {
-        const T_PUSH_HINGE_SERIES& hinge = run.hinges[h];
-        const bool y = hinge.place.component == HINGE_COMPONENT::My;
-        if (!y && hinge.place.component != HINGE_COMPONENT::Mz) continue;
-        const double at = run.data.hinges[h].at;
-        if (at > kAtEnd && at < 1.0 - kAtEnd) continue;
-        T_ENDS<std::array<double, 2>>& turns = out[hinge.place.element];
-        (at < 0.5 ? turns.I : turns.J)[y ? 0 : 1] +=
-            hinge.deformation[static_cast<std::size_t>(m_step - 1)];
-    }
-    return out;
 }
 
 void CResultView::ReadCurve()

@@ -87,7 +87,6 @@ private:
     void ReadMoves(const T_VIEW_RESULTS& results, const solver::T_LOAD_CASE& loads, bool hasFrame);
     void ReadQuantity(const T_VIEW_RESULTS& results, const solver::T_LOAD_CASE& loads);
     void ReadCurve();
-    T_HINGE_TURNS HingeTurns() const;
     std::vector<std::string> Facts() const;
     std::string DiagramFacts() const;
 

@@ -34,10 +34,7 @@ bool HasKind(const T_FRAME_SCENE& scene, ELEM_KIND kind)
     return std::ranges::any_of(scene.lines, [&](const auto& l) { return l.kind == kind; });
 }
 
-struct T_ENTRY {
-    QString text;
-    std::function<void(QPainter&, QPointF middle)> swatch;
-};
+using T_ENTRY = T_LEGEND_ENTRY;
 
 T_ENTRY LineEntry(const QString& text, const QPen& pen)
 {
@@ -111,11 +108,13 @@ std::vector<T_ENTRY> Entries(const T_FRAME_PICTURE& picture, const T_FRAME_OPTIO
                            p.setPen(QPen(kChosenColor, 7.0, Qt::SolidLine, Qt::RoundCap));
                            p.drawLine(m - QPointF(8, 0), m + QPointF(8, 0));
                        }});
+    for (T_ENTRY& entry : CResultPainter::Legend(picture.results))
+        out.push_back(std::move(entry));
     if (options.hinges && picture.marks) AddStates(*picture.marks, out);
     const bool hinged = !picture.marks && std::ranges::any_of(scene.lines, [](const auto& l) {
         return l.hingeI || l.hingeJ;
     });
-    if (options.hinges && hinged)
+    if (options.hinges && hinged && !picture.results.HasValues())
         out.push_back({Text("IDS_QM_UI_FRAME_HINGES"), [](QPainter& p, QPointF m) {
                            p.setPen(Qt::NoPen);
                            p.setBrush(kHingeColor);
@@ -176,7 +175,19 @@ double DrawTitles(QPainter* painter, const QRectF& rect, const T_FRAME_PICTURE& 
     };
     line(picture.scene->title, 15.0, true);
     line(picture.subtitle, 12.5, false);
-    line(picture.note, kTextPx, false);
+    if (!picture.note.empty()) { // in as many lines as it takes
+        const QFont font = CPlot::Font(kTextPx, false);
+        const QRectF room(rect.left() + kPad, y, std::max(rect.width() - 2 * kPad, 40.0), 200.0);
+        const QString text = QString::fromStdString(picture.note);
+        constexpr int kFlags = Qt::AlignHCenter | Qt::AlignTop | Qt::TextWordWrap;
+        const QRectF taken = QFontMetricsF(font).boundingRect(room, kFlags, text);
+        if (painter) {
+            painter->setFont(font);
+            painter->setPen(Qt::black);
+            painter->drawText(room, kFlags, text);
+        }
+        y += taken.height() + 1;
+    }
     if (painter) painter->setFont(CPlot::Font(kTextPx, false));
     return y - rect.top();
 }
@@ -228,6 +239,11 @@ QPen BandPen(std::size_t band)
     constexpr std::array<QRgb, kBands> kColors{0xff2e7d32, 0xff9e9d24, 0xfff9a825,
                                                0xffe64a19, 0xff7f0000, 0xff90a4ae};
     return {QColor(kColors[band]), 3.6, Qt::SolidLine, Qt::FlatCap};
+}
+
+QColor HingeStateColor(PUSH_STATE state)
+{
+    return QColor(kStateLooks[static_cast<std::size_t>(state)].color);
 }
 
 void DrawHingeState(QPainter& painter, QPointF at, PUSH_STATE state)

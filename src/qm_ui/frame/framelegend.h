@@ -16,6 +16,7 @@ QPen FramePen(ELEM_KIND kind, bool faint, bool thick);
 /// Pen of a band of ratios (ratiobands.h).
 QPen BandPen(std::size_t band);
 
+QColor HingeStateColor(PUSH_STATE state);
 /// A hinge in a state, by colour and shape.
 void DrawHingeState(QPainter& painter, QPointF at, PUSH_STATE state);
 

@@ -22,106 +22,91 @@
 
 namespace {
 
-constexpr double kMargin = 28.0;
-constexpr double kHit = 10.0;
 constexpr std::size_t kSmooth = 4000; // members up to which lines are smoothed
-constexpr double kCell = 34.0;        // px between numbers that are drawn
-constexpr double kFromEnd = 0.08;     // of a line: hinges at a joint stay apart
+constexpr std::size_t kManyMarks = 2000;
+constexpr double kCell = 34.0;    // px between numbers that are drawn
+constexpr double kFromEnd = 0.08; // of a line: hinges at a joint stay apart
 
 using KIND = ELEM_KIND;
 constexpr std::array<KIND, 3> kKinds{KIND::Beam, KIND::Truss, KIND::Link};
 
-/// Axes of the page in space.
-struct T_AXES {
-    std::array<double, 3> right{}, up{};
-};
-
-T_AXES AxesOf(const T_CAMERA& camera)
-{
-    constexpr double kRad = std::numbers::pi / 180.0;
-    const double sy = std::sin(camera.yawDeg * kRad), cy = std::cos(camera.yawDeg * kRad);
-    const double sp = std::sin(camera.pitchDeg * kRad), cp = std::cos(camera.pitchDeg * kRad);
-    return {{cy, sy, 0.0}, {-sy * sp, cy * sp, cp}};
-}
-
-double Dot(const std::array<double, 3>& a, const std::array<double, 3>& b)
-{
-    return a[0] * b[0] + a[1] * b[1] + a[2] * b[2];
-}
-
-/// The three axes in the lower left corner.
-void DrawTriad(QPainter& painter, const QRectF& area, const T_AXES& axes)
-{
-    constexpr double kLength = 28.0;
-    const std::array<std::pair<const char*, QColor>, 3> names{{{"X", QColor(0xc6, 0x28, 0x28)},
-                                                               {"Y", QColor(0x2e, 0x7d, 0x32)},
-                                                               {"Z", QColor(0x15, 0x65, 0xc0)}}};
-    const QPointF from = area.bottomLeft() + QPointF(14, -30);
-    for (std::size_t d = 0; d < 3; ++d) {
-        const QPointF tip = from + kLength * QPointF(axes.right[d], -axes.up[d]);
-        if (QLineF(from, tip).length() < 3.0) continue; // it points at the viewer
-        painter.setPen(QPen(names[d].second, 1.5));
-        painter.drawLine(from, tip);
-        painter.drawText(tip + 0.25 * (tip - from) + QPointF(-4, 4), names[d].first);
-    }
-}
-
 } // namespace
 
-/// Node places on the page. The frame fits at zoom 1, with room for displacements of the size that
-/// a round scale gives them: the room is the same for all steps.
-void CFramePainter::PlaceDesign(const T_FRAME_PICTURE& picture, const T_CAMERA& camera,
-                                const QRectF& area)
+double RoomOf(const T_FRAME_PICTURE& picture)
 {
-    const auto& nodes = picture.scene->nodes;
-    const T_AXES axes = AxesOf(camera);
-    m_design.resize(nodes.size());
-    constexpr double kFar = std::numeric_limits<double>::infinity();
-    double left = kFar, right = -kFar, low = kFar, high = -kFar;
-    for (std::size_t n = 0; n < nodes.size(); ++n) {
-        const double x = Dot(nodes[n].xyz, axes.right), y = Dot(nodes[n].xyz, axes.up);
-        m_design[n] = {x, y};
-        left = std::min(left, x);
-        right = std::max(right, x);
-        low = std::min(low, y);
-        high = std::max(high, y);
-    }
-    const double room = picture.displacement
-                            ? 2.0 * CFrameScene::kShown * std::hypot(right - left, high - low)
-                            : 0.0;
-    const double w = std::max(right - left + room, 1e-12), h = std::max(high - low + room, 1e-12);
-    const double px = camera.zoom * std::min(std::max(area.width() - 2 * kMargin, 10.0) / w,
-                                             std::max(area.height() - 2 * kMargin, 10.0) / h);
-    const QPointF centre = area.center() + camera.pan;
-    const double cx = 0.5 * (left + right), cy = 0.5 * (low + high);
-    for (QPointF& p : m_design)
-        p = {centre.x() + px * (p.x() - cx), centre.y() - px * (p.y() - cy)};
-    m_pxPerLength = px;
+    constexpr double kForValues = 0.16; // of diagrams and arrows in the size that suits
+    double room = picture.displacement ? 2.0 * CFrameScene::kShown : 0.0;
+    if (picture.results.diagram || picture.results.marks)
+        room += kForValues * std::min(picture.results.size, 2.0);
+    return room;
 }
 
-void CFramePainter::PlaceMoved(const T_FRAME_PICTURE& picture, const T_CAMERA& camera)
+void CFramePainter::PlaceMoved(const T_FRAME_PICTURE& picture)
 {
     const auto& nodes = picture.scene->nodes;
-    const T_AXES axes = AxesOf(camera);
     m_moved = m_design;
+    m_bent.clear();
+    m_bentAt.clear();
     if (!picture.displacement || picture.displacement->size() != nodes.size()) return;
-    for (std::size_t n = 0; n < nodes.size(); ++n) {
-        const auto& move = (*picture.displacement)[n];
-        m_moved[n] +=
-            m_pxPerLength * picture.scale * QPointF(Dot(move, axes.right), -Dot(move, axes.up));
+    for (std::size_t n = 0; n < nodes.size(); ++n)
+        m_moved[n] = m_projection.Moved(m_design[n], nodes[n].xyz, (*picture.displacement)[n],
+                                        picture.scale);
+    if (picture.results.bent) PlaceBent(picture);
+}
+
+/// As many points as the line's length on the page can show.
+void CFramePainter::PlaceBent(const T_FRAME_PICTURE& picture)
+{
+    constexpr double kPxPerPart = 9.0;
+    const T_FRAME_SCENE& scene = *picture.scene;
+    const T_BENT_LINES& bent = *picture.results.bent;
+    if (bent.moved.size() != scene.lines.size() * (bent.parts + 1)) return;
+    const T_PLACED_FRAME placed{scene, m_projection, picture.displacement, &bent, picture.scale};
+    for (std::size_t l = 0; l < scene.lines.size(); ++l) {
+        m_bentAt.push_back(m_bent.size());
+        const T_SCENE_LINE& line = scene.lines[l];
+        const double px = QLineF(m_moved[line.i], m_moved[line.j]).length();
+        std::size_t parts = 1;
+        while (parts < bent.parts && kPxPerPart * static_cast<double>(parts) < px)
+            parts *= 2;
+        for (std::size_t k = 0; k <= parts; ++k)
+            m_bent.push_back(
+                m_projection.At(placed.On(l, static_cast<double>(k) / static_cast<double>(parts))));
     }
+    m_bentAt.push_back(m_bent.size());
+}
+
+/// A rigid offset goes straight from its node.
+void CFramePainter::AddLine(const T_FRAME_SCENE& scene, std::size_t l,
+                            const std::vector<QPointF>& at, bool bent,
+                            std::vector<QLineF>& out) const
+{
+    const T_SCENE_LINE& line = scene.lines[l];
+    if (!bent || m_bentAt.empty()) {
+        out.emplace_back(at[line.i], at[line.j]);
+        return;
+    }
+    constexpr std::array<double, 3> kNone{};
+    const std::size_t last = m_bentAt[l + 1] - 1;
+    if (line.offsetI != kNone) out.emplace_back(at[line.i], m_bent[m_bentAt[l]]);
+    for (std::size_t k = m_bentAt[l]; k < last; ++k)
+        out.emplace_back(m_bent[k], m_bent[k + 1]);
+    if (line.offsetJ != kNone) out.emplace_back(m_bent[last], at[line.j]);
 }
 
 void CFramePainter::DrawLines(QPainter& painter, const T_FRAME_SCENE& scene,
                               const std::vector<QPointF>& at, bool faint)
 {
-    for (const KIND kind : kKinds) {
-        m_lines.clear();
-        for (const T_SCENE_LINE& line : scene.lines)
-            if (line.kind == kind) m_lines.emplace_back(at[line.i], at[line.j]);
-        if (m_lines.empty()) continue;
-        painter.setPen(FramePen(kind, faint, scene.lines.size() <= kSmooth));
-        painter.drawLines(m_lines.data(), static_cast<int>(m_lines.size()));
+    for (auto& lines : m_kinds)
+        lines.clear();
+    for (std::size_t l = 0; l < scene.lines.size(); ++l) {
+        const auto kind = static_cast<std::size_t>(scene.lines[l].kind);
+        if (kind < m_kinds.size()) AddLine(scene, l, at, !faint, m_kinds[kind]);
+    }
+    for (std::size_t k = 0; k < m_kinds.size(); ++k) {
+        if (m_kinds[k].empty()) continue;
+        painter.setPen(FramePen(kKinds[k], faint, scene.lines.size() <= kSmooth));
+        painter.drawLines(m_kinds[k].data(), static_cast<int>(m_kinds[k].size()));
     }
 }
 
@@ -155,10 +140,16 @@ void CFramePainter::DrawChosen(QPainter& painter, const T_FRAME_PICTURE& picture
     const auto& lines = picture.scene->lines;
     m_lines.clear();
     for (std::size_t l = 0; l < lines.size() && l < picture.chosen.size(); ++l)
-        if (picture.chosen[l]) m_lines.emplace_back(m_moved[lines[l].i], m_moved[lines[l].j]);
-    if (m_lines.empty()) return;
-    painter.setPen(QPen(kChosenColor, 7.0, Qt::SolidLine, Qt::RoundCap));
-    painter.drawLines(m_lines.data(), static_cast<int>(m_lines.size()));
+        if (picture.chosen[l]) AddLine(*picture.scene, l, m_moved, true, m_lines);
+    if (!m_lines.empty()) {
+        painter.setPen(QPen(kChosenColor, 7.0, Qt::SolidLine, Qt::RoundCap));
+        painter.drawLines(m_lines.data(), static_cast<int>(m_lines.size()));
+    }
+    painter.setPen(QPen(kChosenColor.darker(140), 1.0));
+    painter.setBrush(kChosenColor);
+    for (const std::size_t node : picture.chosenNodes)
+        if (node < m_moved.size()) painter.drawEllipse(m_moved[node], 5.5, 5.5);
+    painter.setBrush(Qt::NoBrush);
 }
 
 /// Of a model without elements, whose results came from another solver.
@@ -173,19 +164,22 @@ void CFramePainter::DrawNodes(QPainter& painter) const
 }
 
 /// A triangle under a node that is held from moving, a square where it can't turn either.
-void CFramePainter::DrawSupports(QPainter& painter, const T_FRAME_SCENE& scene) const
+void CFramePainter::DrawSupports(QPainter& painter, const T_FRAME_SCENE& scene, bool quick)
 {
+    m_boxes.clear();
     painter.setPen(QPen(kSupportColor, 1.2));
     painter.setBrush(kSupportColor.lighter(160));
     for (std::size_t n = 0; n < scene.nodes.size(); ++n) {
         const T_DIRS6& held = scene.nodes[n].held;
-        if (!held[0] && !held[1] && !held[2]) continue;
+        if (!scene.nodes[n].shown || (!held[0] && !held[1] && !held[2])) continue;
         const QPointF p = m_design[n];
-        if (held[3] || held[4] || held[5])
-            painter.drawRect(QRectF(p.x() - 5, p.y(), 10, 6));
+        if (quick || held[3] || held[4] || held[5])
+            m_boxes.emplace_back(p.x() - 5, p.y(), 10, 6);
         else
             painter.drawPolygon(QPolygonF{{p, p + QPointF(-5, 8), p + QPointF(5, 8)}});
     }
+    if (quick) painter.setPen(Qt::NoPen);
+    painter.drawRects(m_boxes.data(), static_cast<int>(m_boxes.size()));
     painter.setBrush(Qt::NoBrush);
 }
 
@@ -202,14 +196,24 @@ void CFramePainter::DrawHinges(QPainter& painter, const T_FRAME_SCENE& scene) co
     painter.setBrush(Qt::NoBrush);
 }
 
-/// The worst state on top.
-void CFramePainter::DrawMarks(QPainter& painter, const T_FRAME_PICTURE& picture)
+/// The worst state on top; with perspective what is nearer over what is farther.
+void CFramePainter::PlaceMarks(const T_FRAME_PICTURE& picture)
 {
     const auto& marks = picture.marks->hinges;
     m_hinges.resize(marks.size());
     m_order.resize(marks.size());
     std::iota(m_order.begin(), m_order.end(), std::size_t{0});
-    std::ranges::stable_sort(m_order, {}, [&](std::size_t m) { return marks[m].state; });
+    const auto depth = [&](std::size_t m) {
+        if (!m_projection.IsPerspective()) return 0.0;
+        const T_SCENE_NODE& node =
+            marks[m].line < 0
+                ? picture.scene->nodes[marks[m].node]
+                : picture.scene
+                      ->nodes[picture.scene->lines[static_cast<std::size_t>(marks[m].line)].i];
+        return m_projection.Depth(node.xyz);
+    };
+    std::ranges::stable_sort(m_order, {},
+                             [&](std::size_t m) { return std::pair(depth(m), marks[m].state); });
     for (const std::size_t m : m_order) {
         m_hinges[m] = m_moved[marks[m].node];
         if (marks[m].line >= 0) {
@@ -217,8 +221,29 @@ void CFramePainter::DrawMarks(QPainter& painter, const T_FRAME_PICTURE& picture)
             const double at = kFromEnd + (1.0 - 2.0 * kFromEnd) * marks[m].at;
             m_hinges[m] = m_moved[line.i] + at * (m_moved[line.j] - m_moved[line.i]);
         }
-        DrawHingeState(painter, m_hinges[m], marks[m].state);
     }
+    std::erase_if(m_order, [&](std::size_t m) { return !marks[m].shown; });
+}
+
+void CFramePainter::DrawMarks(QPainter& painter, const T_FRAME_PICTURE& picture, bool quick)
+{
+    const auto& marks = picture.marks->hinges;
+    PlaceMarks(picture);
+    if (quick && m_order.size() > kManyMarks) {
+        painter.setPen(Qt::NoPen);
+        for (std::size_t state = 0; state < kPushStateNames.size(); ++state) {
+            m_boxes.clear();
+            for (const std::size_t m : m_order)
+                if (static_cast<std::size_t>(marks[m].state) == state)
+                    m_boxes.emplace_back(m_hinges[m].x() - 2, m_hinges[m].y() - 2, 4, 4);
+            painter.setBrush(HingeStateColor(static_cast<PUSH_STATE>(state)));
+            painter.drawRects(m_boxes.data(), static_cast<int>(m_boxes.size()));
+        }
+        painter.setBrush(Qt::NoBrush);
+        return;
+    }
+    for (const std::size_t m : m_order)
+        DrawHingeState(painter, m_hinges[m], marks[m].state);
     const auto chosen = std::ranges::find(marks, true, &T_HINGE_MARK::chosen);
     if (chosen == marks.end()) return;
     painter.setPen(QPen(Qt::black, 1.6));
@@ -240,7 +265,8 @@ void CFramePainter::DrawNumbers(QPainter& painter, const QRectF& area,
     };
     if (options.nodeNumbers)
         for (std::size_t n = 0; n < m_moved.size(); ++n)
-            draw(m_moved[n], picture.scene->nodes[n].id, QColor(0x4a, 0x14, 0x8c));
+            if (picture.scene->nodes[n].shown)
+                draw(m_moved[n], picture.scene->nodes[n].id, QColor(0x4a, 0x14, 0x8c));
     if (options.elementNumbers)
         for (const T_SCENE_LINE& line : picture.scene->lines)
             draw(0.5 * (m_moved[line.i] + m_moved[line.j]), line.id, QColor(0x00, 0x60, 0x64));
@@ -255,17 +281,18 @@ void CFramePainter::DrawBackground(QPainter& painter, const QRectF& rect,
     const T_FRAME_SCENE& scene = *picture.scene;
     painter.save();
     painter.setClipRect(rect);
-    PlaceDesign(picture, camera, DrawFrameLegend(nullptr, rect, picture, options));
-    painter.setRenderHint(QPainter::Antialiasing, scene.lines.size() <= kSmooth);
+    m_area = DrawFrameLegend(nullptr, rect, picture, options);
+    painter.setClipRect(m_area); // titles and legend stay free
+    m_projection.Place(scene, camera, m_area, RoomOf(picture), m_design);
+    painter.setRenderHint(QPainter::Antialiasing, scene.lines.size() <= kSmooth && !options.quick);
     if (picture.displacement && options.undeformed) DrawLines(painter, scene, m_design, true);
-    painter.setRenderHint(QPainter::Antialiasing, true);
-    if (options.supports) DrawSupports(painter, scene);
+    painter.setRenderHint(QPainter::Antialiasing, !options.quick);
+    if (options.supports) DrawSupports(painter, scene, options.quick);
     painter.restore();
 }
 
 void CFramePainter::DrawForeground(QPainter& painter, const QRectF& rect,
-                                   const T_FRAME_PICTURE& picture, const T_CAMERA& camera,
-                                   const T_FRAME_OPTIONS& options)
+                                   const T_FRAME_PICTURE& picture, const T_FRAME_OPTIONS& options)
 {
     if (!picture.scene) return;
     const T_FRAME_SCENE& scene = *picture.scene;
@@ -279,20 +306,26 @@ void CFramePainter::DrawForeground(QPainter& painter, const QRectF& rect,
         painter.restore();
         return;
     }
-    PlaceMoved(picture, camera);
-    painter.setRenderHint(QPainter::Antialiasing, scene.lines.size() <= kSmooth);
+    painter.setClipRect(area);
+    PlaceMoved(picture);
+    painter.setRenderHint(QPainter::Antialiasing, scene.lines.size() <= kSmooth && !options.quick);
     DrawChosen(painter, picture);
     DrawLines(painter, scene, m_moved, false);
     if (picture.bands) DrawBands(painter, picture);
-    painter.setRenderHint(QPainter::Antialiasing, true);
+    const T_BENT_LINES* const bent = m_bentAt.empty() ? nullptr : picture.results.bent;
+    m_results.Draw(painter, area, {scene, m_projection, picture.displacement, bent, picture.scale},
+                   picture.results, options.quick);
+    painter.setRenderHint(QPainter::Antialiasing, !options.quick);
     if (scene.lines.empty()) DrawNodes(painter);
     m_hinges.clear();
+    m_order.clear();
     if (options.hinges && picture.marks)
-        DrawMarks(painter, picture);
-    else if (options.hinges)
+        DrawMarks(painter, picture, options.quick);
+    else if (options.hinges && !picture.results.HasValues())
         DrawHinges(painter, scene);
-    if (options.nodeNumbers || options.elementNumbers) DrawNumbers(painter, area, picture, options);
-    DrawTriad(painter, area, AxesOf(camera));
+    if (!options.quick && (options.nodeNumbers || options.elementNumbers))
+        DrawNumbers(painter, area, picture, options);
+    m_projection.DrawTriad(painter, area);
     painter.restore();
 }
 
@@ -300,66 +333,5 @@ void CFramePainter::Draw(QPainter& painter, const QRectF& rect, const T_FRAME_PI
                          const T_CAMERA& camera, const T_FRAME_OPTIONS& options)
 {
     DrawBackground(painter, rect, picture, camera, options);
-    DrawForeground(painter, rect, picture, camera, options);
-}
-
-long CFramePainter::NodeAt(QPointF place) const
-{
-    long nearest = -1;
-    double distance = kHit;
-    for (std::size_t n = 0; n < m_moved.size(); ++n) {
-        const double d = QLineF(place, m_moved[n]).length();
-        if (d >= distance) continue;
-        distance = d;
-        nearest = static_cast<long>(n);
-    }
-    return nearest;
-}
-
-long CFramePainter::HingeAt(QPointF place) const
-{
-    long nearest = -1;
-    double distance = kHit;
-    for (auto m = m_order.rbegin(); m != m_order.rend(); ++m) {
-        if (*m >= m_hinges.size()) continue;
-        const double d = QLineF(place, m_hinges[*m]).length();
-        if (d >= distance) continue;
-        distance = d;
-        nearest = static_cast<long>(*m);
-    }
-    return nearest;
-}
-
-long CFramePainter::LineAt(const T_FRAME_SCENE& scene, QPointF place) const
-{
-    long nearest = -1;
-    double distance = kHit;
-    for (std::size_t l = 0; l < scene.lines.size(); ++l) {
-        const QPointF a = m_moved.at(scene.lines[l].i), b = m_moved.at(scene.lines[l].j);
-        const QPointF along = b - a, from = place - a;
-        const double square = QPointF::dotProduct(along, along);
-        const double t =
-            square > 0.0 ? std::clamp(QPointF::dotProduct(from, along) / square, 0.0, 1.0) : 0.0;
-        const double d = QLineF(place, a + t * along).length();
-        if (d >= distance) continue;
-        distance = d;
-        nearest = static_cast<long>(l);
-    }
-    return nearest;
-}
-
-std::vector<std::size_t> CFramePainter::LinesIn(const T_FRAME_SCENE& scene, const QRectF& box) const
-{
-    std::vector<std::size_t> lines;
-    for (std::size_t l = 0; l < scene.lines.size(); ++l)
-        if (box.contains(m_moved.at(scene.lines[l].i)) &&
-            box.contains(m_moved.at(scene.lines[l].j)))
-            lines.push_back(l);
-    return lines;
-}
-
-const T_CAMERA& CameraFor(int flatAxis)
-{
-    constexpr const T_CAMERA* kStraight[] = {&kElevationYZ, &kElevationXZ, &kPlanXY};
-    return flatAxis < 0 ? kIsometric : *kStraight[flatAxis];
+    DrawForeground(painter, rect, picture, options);
 }

@@ -1,5 +1,6 @@
 // What the view shows of an analysed model, against statics by hand.
 #include "qm_rps/view/parts.h"
+#include "qm_rps/view/resulttable.h"
 #include "qm_rps/view/resultview.h"
 
 #include <gtest/gtest.h>
@@ -202,4 +203,75 @@ TEST_F(ResultView, HiddenElementsAreGoneFromWhatIsShown)
     Show(KIND::Static, 1, VIEW_WHAT::Reactions);
     for (const T_ARROW_MARK& a : view.Marks()->arrows)
         EXPECT_LT(a.at[0], 7000.0);
+}
+
+TEST_F(ResultView, TablesHaveExtremesBetweenPositionsAndTheCasesOfAnEnvelope)
+{
+    view.Refresh();
+    T_RESULT_TABLE_CHOICE choice;
+    for (const T_SHAPE_SOURCE& source : view.Sources())
+        if (source.kind == KIND::Static) choice.sources.emplace_back(source, 1);
+    choice.elements = {1};
+    T_RESULT_TABLE table;
+    std::string why;
+    ASSERT_TRUE(MakeResultTable(doc, scene, choice, table, why)) << why;
+    // DL: five positions. LL: these, and the load's place at 2 m, where My is P a b / L.
+    ASSERT_EQ(11U, table.rows.size());
+    EXPECT_EQ("x = 2000", table.rows[10][2].text);
+    EXPECT_NEAR(-16000.0, table.rows[10][7].number.value(), 1e-6);
+    choice.envelope = true;
+    ASSERT_TRUE(MakeResultTable(doc, scene, choice, table, why)) << why;
+    const auto row = std::ranges::find_if(
+        table.rows, [](const auto& r) { return r[1].text == "member" && r[2].text == "My"; });
+    ASSERT_NE(table.rows.end(), row);
+    EXPECT_NEAR(-16000.0, (*row)[4].number.value(), 1e-6); // of DL 9000
+    EXPECT_EQ("LL", (*row)[5].text);
+    EXPECT_NE(std::string::npos, CsvText(table).find("\n1,member,My,kN*mm,-1"));
+    doc.Data().SetStaticResult(2, nullptr);
+    view.Refresh();
+    choice.sources[1].first = view.Sources()[2];
+    EXPECT_FALSE(MakeResultTable(doc, scene, choice, table, why));
+    EXPECT_NE(std::string::npos, why.find("LL"));
+}
+
+TEST(HingeTurns, BehindThemTheMembersHaveTheMomentsOfTheirHinges)
+{
+    CDBDoc doc;
+    T_FILE_ERROR fileError;
+    ASSERT_TRUE(doc.ImportCase(QM_PROJECT "/examples/rc-frame-3-storey/case.json", fileError));
+    CPushRun push(doc);
+    std::vector<T_PUSH_RUN> runs;
+    std::string why;
+    int key = 0;
+    ASSERT_TRUE(doc.Attr().FindPolc("PX_HINGES", key));
+    ASSERT_TRUE(push.Run(key, {}, runs, why)) << why;
+    const T_PUSH_RUN& run = runs.at(0);
+    CViewFrame frame(doc);
+    ASSERT_TRUE(frame.Refresh(why)) << why;
+    std::size_t flowed = 0;
+    for (const int step : {1, 25, static_cast<int>(run.loadFactor.size())}) {
+        const auto at = static_cast<std::size_t>(step - 1);
+        const T_HINGE_TURNS turns = HingeTurnsOf(run, step);
+        const auto moved = [&](std::size_t node) {
+            const int id = frame.NodeId(node);
+            return run.data.displacement[at][static_cast<std::size_t>(
+                std::ranges::find(run.data.nodes, id) - run.data.nodes.begin())];
+        };
+        for (std::size_t h = 0; h < run.hinges.size(); ++h) {
+            const T_PUSH_HINGE_SERIES& hinge = run.hinges[h];
+            const auto e = static_cast<std::size_t>(frame.ElementAt(hinge.place.element));
+            // Columns have no loads between their ends.
+            if (std::fabs(frame.Axes(e)->x[2]) < 0.5) continue;
+            if (hinge.place.component != HINGE_COMPONENT::My) continue;
+            T_LINE_ENDS ends = frame.Ends(e, moved(frame.Frame().elements[e].i),
+                                          moved(frame.Frame().elements[e].j));
+            TakeHinges(turns, hinge.place.element, ends);
+            const CMemberLine member(frame.Axes(e)->length, ends, frame.Stiffness(e));
+            const double x = run.data.hinges[h].at * member.Length();
+            EXPECT_NEAR(hinge.force[at], member.Force(4, x), 1e-6 * std::fabs(hinge.force[at]) + 1)
+                << hinge.place.element << hinge.place.end << " step " << step;
+            if (hinge.deformation[at] != 0.0) ++flowed;
+        }
+    }
+    EXPECT_GE(flowed, 4U); // the heads of the four columns of the ground storey
 }
