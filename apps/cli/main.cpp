@@ -58,6 +58,7 @@ int RunCommand(int argc, char** argv)
     AddSection(app, code);
     AddCase(app, code);
     AddAnalyse(app, code);
+    AddViews(app, code);
     AddPush(app, code);
     AddJudge(app, code);
     AddUlf(app, code);

@@ -28,6 +28,8 @@ void AddSection(CLI::App& app, EXIT_CODE& code);
 void AddSectionBars(CLI::App& section, EXIT_CODE& code);
 void AddCase(CLI::App& app, EXIT_CODE& code);
 void AddAnalyse(CLI::App& app, EXIT_CODE& code);
+/// Pictures and tables of results.
+void AddViews(CLI::App& app, EXIT_CODE& code);
 void AddUlf(CLI::App& app, EXIT_CODE& code);
 void AddPush(CLI::App& app, EXIT_CODE& code);
 /// Commands below "push" and below "case".

@@ -1,0 +1,40 @@
+// Pictures and tables of results through the program.
+#include "program.h"
+
+namespace {
+
+class ViewCommands : public CProgramTest {};
+
+} // namespace
+
+TEST_F(ViewCommands, ReactionsCarryTheLoads)
+{
+    const json table =
+        Json("results @rc-frame-code-hinges --case G --case TRIANGLE --what reactions");
+    ASSERT_EQ("FX (kN)", table.at("columns").at(2));
+    double up = 0.0, along = 0.0;
+    for (const json& row : table.at("rows")) {
+        if (row.at(0) == "G") up += row.at(4).get<double>();
+        if (row.at(0) == "TRIANGLE") along += row.at(2).get<double>();
+    }
+    EXPECT_NEAR(4 * 32.6 * 4.6, up, 1e-6); // on the flexible lengths of four beams
+    EXPECT_NEAR(-300.0, along, 1e-6);
+    Done("results @rc-frame-code-hinges --envelope --csv e.csv --xlsx e.xlsx");
+    ExpectHolds(Text("e.csv"), {"Element,Position,Component,Unit,Smallest,in,Largest,in\n",
+                                "\n11,member,My,kN*m,"});
+    EXPECT_EQ("PK", Text("e.xlsx").substr(0, 2));
+}
+
+TEST_F(ViewCommands, PicturesSayWhatTheyShowAndWhatIsNotThere)
+{
+    Done("picture @rc-frame-code-hinges --case G --what My -o my.svg");
+    ExpectHolds(Text("my.svg"), {"moment My", "kN*m", "tension"});
+    Done("picture @cable-stayed-bridge --case DEAD --what loads --look iso --perspective -o l.svg");
+    ExpectHolds(Text("l.svg"), {"loads"});
+    Done("picture @rc-frame-code-hinges --push PX --step 20 --what hinges --elements 1-4 -o h.svg");
+    ExpectHolds(Text("h.svg"), {"step 20 of", "hidden elements"});
+    ExpectRefused("picture @rc-frame-code-hinges --mode 1 --what My -o no.svg", 1, "no forces");
+    ExpectRefused("picture @rc-frame-code-hinges --case none -o no.svg", 2, "none");
+    ExpectRefused("results @rc-frame-code-hinges --case G --elements 999", 2, "999");
+    EXPECT_FALSE(std::filesystem::exists(m_folder / "no.svg"));
+}
