@@ -28,7 +28,7 @@ void AddSources(CLI::App* sub, T_SOURCE_OPTIONS& o, bool several)
 #ifdef QM_UI
 void AddPicture(CLI::App& app, EXIT_CODE& code)
 {
-    auto* sub = app.add_subcommand("picture", Say("IDS_QM_HELP_PICTURE"));
+    auto* sub = app.add_subcommand("picture", Say("IDS_QM_HELP_PICTURE_COMMAND"));
     auto o = std::make_shared<T_PICTURE_OPTIONS>();
     AddSources(sub, *o, false);
     sub->add_option("--what", o->what, Say("IDS_QM_HELP_PICTURE_WHAT"))

@@ -1,15 +1,13 @@
-// The frame view with its controls: what it is shown under, the step, the scale, what is drawn.
+// The frame view under its bar of results; what is clicked in it is chosen in every pane.
 #pragma once
 
 #include "qm_rps/desk/selection.h"
 #include "qm_ui/frame/frameview.h"
 #include "qm_ui/report/picturefile.h"
+#include "qm_ui/view/resultsbar.h"
 
 #include <QWidget>
 
-class QComboBox;
-class QLabel;
-class QLineEdit;
 class QSlider;
 
 class CFramePane : public QWidget {
@@ -24,32 +22,33 @@ public:
     /// 1 shown; 0 there is no such source.
     int Show(const T_SHAPE_SOURCE& source, int step);
     void SetStep(int step);
+    /// Another quantity, numbers or scale.
+    void SetChoice(const T_VIEW_CHOICE& choice);
     /// Looks at the frame as suits it: a plane one straight on, any other isometrically.
     void ResetCamera();
+    /// Another source, step or model is shown and stands.
+    std::function<void()> m_onResults;
     CFrameView& View() { return *m_view; }
-    QSlider& Slider() { return *m_slider; }
-    const std::vector<T_SHAPE_SOURCE>& Sources() const { return m_sources; }
+    CResultsBar& Bar() { return *m_bar; }
+    QSlider& Slider() { return m_bar->Slider(); }
+    const CResultView& Shown() const { return m_shown; }
+    const std::vector<T_SHAPE_SOURCE>& Sources() const { return m_shown.Sources(); }
+    CDBDoc& Doc() { return m_doc; }
+    CSelection& Selection() { return m_selection; }
     /// What is shown, for a file or a printer; valid until the document changes.
     T_DRAWING Drawing() const;
 
 private:
-    QString NameOf(const T_SHAPE_SOURCE& source) const;
-    void ShowSource();
-    void ShowStep();
-    void TakeScale();
-    void Choose(const std::vector<std::size_t>& lines);
-    void MarkChosen();
+    void ShowPicture();
+    void ShowResults();
+    void Choose(const T_PICK& pick);
+    void OnSelection();
 
+    CDBDoc& m_doc;
     CFrameScene& m_scene;
     CSelection& m_selection;
-    CShownHinges m_hinges;
-    std::vector<T_SHAPE_SOURCE> m_sources;
-    std::vector<std::array<double, 3>> m_moves;
-    bool m_ownScale = false; // typed by the person
-    double m_scale = 1.0;
+    CResultView m_shown;
+    CSelection::T_KEYS m_hidden; // as they are shown
     CFrameView* m_view;
-    QComboBox* m_source;
-    QSlider* m_slider;
-    QLabel *m_step, *m_scaleLabel, *m_sourceLabel;
-    QLineEdit* m_scaleEdit;
+    CResultsBar* m_bar;
 };

@@ -31,7 +31,7 @@ TEST_F(ViewCommands, PicturesSayWhatTheyShowAndWhatIsNotThere)
     ExpectHolds(Text("my.svg"), {"moment My", "kN*m", "tension"});
     Done("picture @cable-stayed-bridge --case DEAD --what loads --look iso --perspective -o l.svg");
     ExpectHolds(Text("l.svg"), {"loads"});
-    Done("picture @rc-frame-code-hinges --push PX --step 20 --what hinges --elements 1-4 -o h.svg");
+    Done("picture @rc-frame-code-hinges --push PX --step 20 --elements 1-4 -o h.svg");
     ExpectHolds(Text("h.svg"), {"step 20 of", "hidden elements"});
     ExpectRefused("picture @rc-frame-code-hinges --mode 1 --what My -o no.svg", 1, "no forces");
     ExpectRefused("picture @rc-frame-code-hinges --case none -o no.svg", 2, "none");

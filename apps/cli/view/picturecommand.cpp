@@ -6,6 +6,7 @@
 #include "qm_ui/view/viewpicture.h"
 
 #include <algorithm>
+#include <cstdio>
 
 namespace {
 
@@ -72,8 +73,11 @@ EXIT_CODE RunPicture(const T_PICTURE_OPTIONS& o)
     T_FRAME_OPTIONS options;
     options.nodeNumbers = options.elementNumbers = o.numbers;
     std::string error;
-    if (WritePictureFile(DrawingOf(view, selection, CameraOf(o, view.Scene()), options), o.out,
-                         error))
-        return EXIT_CODE::Done;
-    return Complain(EXIT_CODE::NoAccess, error);
+    if (!WritePictureFile(DrawingOf(view, selection, CameraOf(o, view.Scene()), options), o.out,
+                          error))
+        return Complain(EXIT_CODE::NoAccess, error);
+    const std::string note = view.Note();
+    std::printf("%s: %s%s%s\n", o.out.c_str(), view.Subtitle().c_str(), note.empty() ? "" : "; ",
+                note.c_str());
+    return EXIT_CODE::Done;
 }

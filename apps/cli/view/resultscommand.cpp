@@ -69,6 +69,11 @@ EXIT_CODE WriteTable(const T_RESULTS_OPTIONS& o, const T_RESULT_TABLE& table)
     T_FILE_ERROR error;
     if (code == EXIT_CODE::Done && !o.xlsx.empty() && !WriteSheet(o.xlsx, SheetOf(table), error))
         code = ReportFileError(error);
+    if (code != EXIT_CODE::Done || o.csv == "-" || o.json == "-") return code;
+    for (const std::string* file : {&o.csv, &o.json, &o.xlsx})
+        if (!file->empty())
+            std::printf("%s: %s\n", file->c_str(),
+                        Say("IDS_QM_VIEW_ROWS", std::to_string(table.rows.size())).c_str());
     if (o.csv.empty() && o.json.empty() && o.xlsx.empty())
         std::printf("%s", TerminalText(table).c_str());
     return code;
