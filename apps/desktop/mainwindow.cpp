@@ -3,9 +3,11 @@
 #include "explorerpane.h"
 #include "newtools.h"
 #include "reporttools.h"
+#include "resultspane.h"
 #include "shell/menus.h"
 #include "shell/shell.h"
 #include "toolcommands.h"
+#include "viewtools.h"
 
 #include "qm_base/messagehistory.h"
 #include "qm_base/msgfunction.h"
@@ -77,7 +79,8 @@ CMainWindow::~CMainWindow()
 {
     SetMessageHistorySink({});
     m_shell.reset();
-    delete takeCentralWidget(); // panes tell the selection, which goes before the window's children
+    delete m_results; // these watch the selection, which goes before the window's children
+    delete takeCentralWidget();
 }
 
 // ---- panes and menus ----------------------------------------------------------------------------
@@ -100,6 +103,8 @@ void CMainWindow::MakePanes()
     };
     QDockWidget* left = dock(m_explorer, "IDS_QM_UI_EXPLORER", Qt::LeftDockWidgetArea);
     QDockWidget* below = dock(m_messages, "IDS_QM_UI_MESSAGES", Qt::BottomDockWidgetArea);
+    m_results = new CResultsPane(*m_framePane, this);
+    dock(m_results, "IDS_QM_VIEW_RESULTS", Qt::BottomDockWidgetArea)->hide();
     setCorner(Qt::BottomLeftCorner, Qt::LeftDockWidgetArea);
     resizeDocks({left}, {430}, Qt::Horizontal);
     resizeDocks({below}, {110}, Qt::Vertical);
@@ -110,6 +115,7 @@ void CMainWindow::MakePanes()
 void CMainWindow::MakeMenus()
 {
     for (const T_COMMANDS& part : {FileCommands(), EditCommands(), ViewCommands(),
+                                   ViewPartCommands(*m_framePane, "IDS_QM_UI_MENU_VIEW"),
                                    ToolCommands(m_desktop), WindowCommands()})
         m_commands.insert(m_commands.end(), part.begin(), part.end());
     const T_COMMANDS fresh = NewCommands(m_desktop); // below the first of the menu File, New
@@ -170,6 +176,7 @@ void CMainWindow::ShowTexts()
     m_explorer->Retranslate();
     m_framePane->Retranslate();
     if (m_shell) m_shell->Retranslate();
+    m_results->Retranslate();
 }
 
 void CMainWindow::UpdateActions()
@@ -299,7 +306,8 @@ T_COMMANDS CMainWindow::ViewCommands()
             flag("IDS_QM_UI_VIEW_BEFORE", "", &O::undeformed),
             {kMenu},
             pane("IDS_QM_UI_EXPLORER"),
-            pane("IDS_QM_UI_MESSAGES")};
+            pane("IDS_QM_UI_MESSAGES"),
+            pane("IDS_QM_VIEW_RESULTS")};
 }
 
 T_COMMANDS CMainWindow::WindowCommands()

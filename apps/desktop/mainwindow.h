@@ -11,6 +11,7 @@
 #include <memory>
 
 class CExplorerPane;
+class CResultsPane;
 class CShell;
 class QAction;
 class QLabel;
@@ -71,6 +72,7 @@ private:
     QElapsedTimer m_clock;
     CFramePane* m_framePane = nullptr;
     CExplorerPane* m_explorer = nullptr;
+    CResultsPane* m_results = nullptr;
     QPlainTextEdit* m_messages = nullptr;
     QLabel* m_units = nullptr;
     QMenu* m_recent = nullptr;

@@ -13,6 +13,7 @@
 #include "shell/startpage.h"
 #include "structuretools.h"
 #include "ulftools.h"
+#include "viewtools.h"
 
 #include "qm_rps/preferencesdlg.h"
 #include "qm_ui/form/dialogwindow.h"
@@ -63,9 +64,9 @@ std::vector<T_WINDOW_EXAMPLE> WindowExamples()
                                       {"main-space", "space-frame-3d", shown(KIND::Static)},
                                       {"preferences", "", preferences},
                                       {"help", "", help}};
-    for (auto& part : {PushWindowExamples(), PushoverWindowExamples(), LoadCaseWindowExamples(),
-                       StructureWindowExamples(), ReportWindowExamples(), HingeWindowExamples(),
-                       UlfWindowExamples(), NewWindowExamples()})
+    for (auto& part : {ViewWindowExamples(), PushWindowExamples(), PushoverWindowExamples(),
+                       LoadCaseWindowExamples(), StructureWindowExamples(), ReportWindowExamples(),
+                       HingeWindowExamples(), UlfWindowExamples(), NewWindowExamples()})
         all.insert(all.end(), part.begin(), part.end());
     return all;
 }
