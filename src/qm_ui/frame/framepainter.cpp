@@ -34,7 +34,7 @@ constexpr std::array<KIND, 3> kKinds{KIND::Beam, KIND::Truss, KIND::Link};
 
 double RoomOf(const T_FRAME_PICTURE& picture)
 {
-    constexpr double kForValues = 0.16; // of diagrams and arrows in the size that suits
+    constexpr double kForValues = 0.26; // of diagrams and arrows in the size that suits
     double room = picture.displacement ? 2.0 * CFrameScene::kShown : 0.0;
     if (picture.results.diagram || picture.results.marks)
         room += kForValues * std::min(picture.results.size, 2.0);
