@@ -8,8 +8,7 @@
 #include "qm_rps/hinge/hingetypefindings.h"
 #include "qm_rps/po_hingetypedlg.h"
 #include "qm_rps/po_hingetypelistdlg.h"
-#include "qm_rps/push/pushwarnings.h"
-#include "qm_rps/push/stopwarnings.h"
+#include "qm_rps/push/casecheck.h"
 #include "qm_rps/pushoverhingelistdlg.h"
 
 #include <algorithm>
@@ -183,39 +182,18 @@ EXIT_CODE RunCaseCheck(const std::string& file)
 {
     CDBDoc doc;
     if (const EXIT_CODE code = OpenInput(doc, file); code != EXIT_CODE::Done) return code;
-    const T_MODEL& model = doc.Data().Model();
     std::size_t findings = 0, warnings = 0;
-    const auto print = [&](const std::string& what, const std::vector<T_FINDING>& all) {
-        for (const T_FINDING& f : all)
-            std::printf("%s: %s: %s\n", what.c_str(), f.field.c_str(), f.text.c_str());
-        findings += all.size();
-    };
-    print(Say("IDS_QM_UI_POGC_TITLE"), PushControlFindings(model.pushControl, model));
-    print(Say("IDS_QM_UI_TABLE_STOREYS"), StoreyFindings(model));
-    for (const auto& [key, function] : model.incrementFunctions)
-        print(Say("IDS_QM_CASE_FUNCTION", function.name), IncrementFunctionFindings(function));
-    for (const auto& entry : model.pushovers) {
-        T_POLC_D polc;
-        if (!doc.Attr().GetPolc(entry.first, polc)) continue;
-        print(polc.name, LoadCaseFindings(polc, model));
-        print(polc.name, PatternFindings(polc.patterns));
-        for (const T_FINDING& f : StopWarnings(doc, polc)) {
-            PrintLine(Say("IDS_QM_CLI_CASE_WARNING", polc.name, f.field, f.text));
-            ++warnings;
-        }
+    for (const T_CASE_REMARK& r : CheckCase(doc)) {
+        const T_FINDING& f = r.finding;
+        if (!r.isWarning)
+            std::printf("%s: %s: %s\n", r.where.c_str(), f.field.c_str(), f.text.c_str());
+        else
+            PrintLine(r.where.empty() ? f.text
+                                      : Say("IDS_QM_CLI_CASE_WARNING", r.where, f.field, f.text));
+        ++(r.isWarning ? warnings : findings);
     }
-    std::vector<std::string> general = PushWarnings(doc);
-    // Without control data the curve is another program's.
-    const bool pushes = std::ranges::any_of(
-        model.pushovers, [](const auto& entry) { return entry.second.control.has_value(); });
-    const std::string elastic = NoHingeText(model);
-    if (pushes && !elastic.empty()) general.insert(general.begin(), elastic);
-    for (const std::string& warning : general) {
-        PrintLine(warning);
-        ++warnings;
-    }
-    PrintLine(Say("IDS_QM_CLI_HINGE_CASE_FINDINGS", std::to_string(model.pushovers.size()),
-                  std::to_string(findings)));
+    PrintLine(Say("IDS_QM_CLI_HINGE_CASE_FINDINGS",
+                  std::to_string(doc.Data().Model().pushovers.size()), std::to_string(findings)));
     if (warnings > 0) PrintLine(Say("IDS_QM_CLI_HINGE_WARNINGS", std::to_string(warnings)));
     return findings == 0 ? EXIT_CODE::Done : EXIT_CODE::NotFound;
 }
