@@ -30,6 +30,12 @@ inline double SpectralDisplacement(double T, double Sa, double gravity)
     return T * T * Sa * (gravity / (4.0 * std::numbers::pi * std::numbers::pi));
 }
 
+/// Base shear of a spectral acceleration: alpha Sa M g. ATC-40 (1996) 8.2.2.1.
+inline double BaseShear(double Sa, double alpha, double mass, double gravity)
+{
+    return std::fabs(Sa * mass * gravity * alpha);
+}
+
 /// Post-yield stiffness over initial stiffness of the bilinear curve through (dy, ay) and
 /// (dpi, api); 0 where api is ay. FEMA 440 (2005) 6.2; may be no real value.
 inline double PostYieldRatio(double dy, double ay, double dpi, double api)

@@ -268,7 +268,7 @@ void CPushOverCurveData::TransferToDispAndReac(double* displacement, double* rea
 {
     if (displacement) *displacement = std::fabs(*displacement * m_factors.gamma);
     if (reaction)
-        *reaction = std::fabs(*reaction * m_factors.mass * m_factors.gravity * m_factors.alpha);
+        *reaction = BaseShear(*reaction, m_factors.alpha, m_factors.mass, m_factors.gravity);
 }
 
 int CPushOverCurveData::PreparePOCurveData()

@@ -1,5 +1,7 @@
 #include "qm_rps/pushover/evaluation/pushovercomparison.h"
 
+#include "qm_rps/pushover/adrsformulas.h"
+
 #include <algorithm>
 
 namespace {
@@ -24,11 +26,12 @@ constexpr std::array<T_METHOD_ROW, 8> kMethods{{
 }};
 // clang-format on
 
-T_COMPARISON_ROW RowOf(const T_METHOD_ROW& method, const T_PUSH_EVALUATION& e,
-                       const CPushEvaluator& evaluator)
+/// state: the one whose demand is taken; null: there is none.
+T_COMPARISON_ROW RowOf(const std::string& label, const T_LIMIT_ROW* state,
+                       const T_PUSH_EVALUATION& e)
 {
     T_COMPARISON_ROW row;
-    row.label = method.label;
+    row.label = label;
     row.outcome = e.outcome;
     if (e.point) {
         row.found = true;
@@ -37,18 +40,33 @@ T_COMPARISON_ROW RowOf(const T_METHOD_ROW& method, const T_PUSH_EVALUATION& e,
         row.D = e.point->D;
         row.V = e.point->V;
     }
-    for (const T_LIMIT_ROW& state : e.limitStates) {
-        if (!method.state || state.name != method.state || !state.demand) continue;
-        const double Sd = e.factors.gamma != 0.0 ? *state.demand / e.factors.gamma : 0.0;
-        const std::optional<double> Sa = CapacityAt(e.capacity, Sd);
-        if (!Sa) continue; // beyond the push: no force belongs to it
-        row.found = true;
-        row.D = *state.demand;
-        row.Sd = Sd;
-        row.Sa = row.V = *Sa;
-        evaluator.TransferToDispAndReac(nullptr, &row.V);
-    }
+    if (!state || !state->demand) return row;
+    const double Sd = e.factors.gamma != 0.0 ? *state->demand / e.factors.gamma : 0.0;
+    const std::optional<double> Sa = CapacityAt(e.capacity, Sd);
+    if (!Sa) return row; // beyond the push: no force belongs to it
+    row.found = true;
+    row.D = *state->demand;
+    row.Sd = Sd;
+    row.Sa = *Sa;
+    row.V = BaseShear(*Sa, e.factors.alpha, e.factors.mass, e.factors.gravity);
     return row;
+}
+
+const T_LIMIT_ROW* StateNamed(const T_PUSH_EVALUATION& e, std::string_view name)
+{
+    const auto at = std::ranges::find(e.limitStates, name, &T_LIMIT_ROW::name);
+    return at == e.limitStates.end() ? nullptr : &*at;
+}
+
+/// SD of Eurocode 8, SLV of NTC; where that is not asked for, the last state with a demand.
+const T_LIMIT_ROW* ComparedState(const T_PUSH_EVALUATION& e)
+{
+    const T_LIMIT_ROW* last = nullptr;
+    for (const T_LIMIT_ROW& state : e.limitStates) {
+        if (state.demand && (state.name == "SD" || state.name == "SLV")) return &state;
+        if (state.demand) last = &state;
+    }
+    return last;
 }
 
 void CalcSpread(T_PUSH_COMPARISON& c)
@@ -72,6 +90,19 @@ std::optional<double> CapacityAt(const T_ADRS_CURVE& curve, double Sd)
     const double first = curve.Sd.front();
     if (Sd < first) return curve.Sa.front() * Sd / first;
     return CurveAccelAt(curve.View(), Sd);
+}
+
+T_PUSH_COMPARISON ComparisonOf(std::vector<T_PUSH_EVALUATION> results)
+{
+    T_PUSH_COMPARISON c;
+    for (const T_PUSH_EVALUATION& e : results) {
+        const T_LIMIT_ROW* const state = ComparedState(e);
+        const std::string label = state ? e.eval.name + " " + state->name : e.eval.name;
+        c.rows.push_back(RowOf(label, state, e));
+    }
+    c.results = std::move(results);
+    CalcSpread(c);
+    return c;
 }
 
 std::vector<std::string> RemarksOf(const T_PUSH_COMPARISON& comparison)
@@ -99,7 +130,9 @@ int ComparePushover(CPushEvaluator& evaluator, const T_COMPARISON_CASE& asked,
         if (asked.progress) asked.progress(c.rows.size(), kMethods.size());
         if (!evaluator.SetEvaluation(eval, refusal)) return 0;
         evaluator.Evaluate();
-        c.rows.push_back(RowOf(method, evaluator.Result(), evaluator));
+        const T_PUSH_EVALUATION& result = evaluator.Result();
+        const T_LIMIT_ROW* const state = method.state ? StateNamed(result, method.state) : nullptr;
+        c.rows.push_back(RowOf(method.label, state, result));
         c.results.push_back(evaluator.Result());
     }
     if (asked.progress) asked.progress(kMethods.size(), kMethods.size());

@@ -21,6 +21,10 @@ struct T_PUSH_COMPARISON {
 /// Sa of a capacity spectrum at Sd, its first ordinate counted from the origin; empty beyond its
 /// end.
 std::optional<double> CapacityAt(const T_ADRS_CURVE& curve, double Sd);
+/// Finished evaluations of one load case side by side, labelled by their names. Of a target
+/// displacement the row is that of SD or SLV, else of the last state with a demand; V is alpha Sa M
+/// g on the capacity curve.
+T_PUSH_COMPARISON ComparisonOf(std::vector<T_PUSH_EVALUATION> results);
 
 /// The messages of all results, each text once, in their order.
 std::vector<std::string> RemarksOf(const T_PUSH_COMPARISON& comparison);
