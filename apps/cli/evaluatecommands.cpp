@@ -11,6 +11,7 @@
 #include "qm_rps/push/pushatpointtext.h"
 #include "qm_rps/push/pushended.h"
 #include "qm_rps/pushover/evaluation/pushovercomparison.h"
+#include "qm_rps/pushover/report/pushoverintro.h"
 #include "qm_rps/pushover/report/pushoverreport.h"
 #include "qm_rps/pushovercalculators.h"
 #include "qm_rps/pushovercurvedlg.h"
@@ -188,9 +189,11 @@ EXIT_CODE WriteReports(CDBDoc& doc, const T_EVALUATE_OPTIONS& o,
     T_JUDGE_OPTIONS options;
     options.code = HingeCodeNamed(o.code);
     std::string text;
-    for (std::size_t i = 0; i < results.size(); ++i)
+    for (std::size_t i = 0; i < results.size(); ++i) {
+        if (!o.plain) text += PushoverIntroText(results[i], doc.Data().Model());
         text += PushoverReportText(results[i]) + HingesAtReport(hinges[i]) +
                 ReportOfJudgement(doc, results[i], options, ProgressOnTerminal(doc));
+    }
     return WriteOutput(o.report, text);
 }
 

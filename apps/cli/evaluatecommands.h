@@ -12,6 +12,7 @@ struct T_EVALUATE_OPTIONS {
     std::string push;                 // name of their push or one direction of it; empty: all
     std::string json;                 // file, or "-" for standard output
     std::string report;               // text report
+    bool plain = false;               // the report alone, without what it rests on
     std::string code;                 // judges members by it in the report; empty: generated hinges
     std::string curve;                // curve table alone
     std::string plot;                 // .svg, .png or .pdf

@@ -17,6 +17,7 @@ void AddEvaluate(CLI::App& app, EXIT_CODE& code)
     sub->add_option("--push", o->push, Say("IDS_QM_HELP_EVALUATE_PUSH"));
     AddJson(sub, o->json);
     auto* const report = sub->add_option("--report", o->report, Say("IDS_QM_HELP_EVALUATE_REPORT"));
+    sub->add_flag("--plain", o->plain, Say("IDS_QM_HELP_PLAIN"))->needs(report);
     sub->add_option("--code", o->code, Say("IDS_QM_HELP_EVALUATE_CODE"))
         ->check(CLI::IsMember(JudgedCodeNames()))
         ->needs(report);

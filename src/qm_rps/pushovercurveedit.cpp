@@ -5,6 +5,7 @@
 #include "qm_rps/desk/recordnames.h"
 #include "qm_rps/evaluatedsteps.h"
 #include "qm_rps/push/pushatpointtext.h"
+#include "qm_rps/pushover/report/pushoverintro.h"
 #include "qm_rps/pushover/report/pushoverreport.h"
 #include "qm_rps/pushovercomparisondlg.h"
 #include "qm_rps/pushovercontroldlg.h"
@@ -263,8 +264,13 @@ void CPushOverCurveEdit::OnPushoverCurveTextout()
         hinges = HingesOfEvaluations(m_doc, {&result, 1}, progress);
         judgement = ReportOfJudgement(m_doc, result, {}, progress);
     });
-    ShowText("IDS_QM_UI_PUSH_REPORT_TITLE",
-             PushoverReportText(result) + HingesAtReport(hinges.front()) + judgement);
+    CPushOverTextDlg preview;
+    preview.SetView(View());
+    preview.m_title = MMSGFunction::GetValue("IDS_QM_UI_PUSH_REPORT_TITLE");
+    preview.m_intro = PushoverIntroText(result, m_doc.Data().Model());
+    preview.m_text = PushoverReportText(result) + HingesAtReport(hinges.front()) + judgement;
+    preview.m_askPath = [this] { return AskPath("IDS_QM_UI_PUSH_TEXT_FILTER"); };
+    (void)preview.DoModal();
 }
 
 void CPushOverCurveEdit::Pushing(const PUSHING_FN& pushing) const

@@ -16,7 +16,7 @@ int CPushOverTextDlg::OnSave()
             return 0;
     }
     std::string error;
-    if (!WritePushoverText(m_text, path, error)) {
+    if (!WritePushoverText(Text(), path, error)) {
         ShowMessage("IDS_RPS_PUSHOVER_Can_t_create_the_file__", error);
         return 0;
     }

@@ -8,6 +8,7 @@
 #include "qm_rps/judge/judgementsheet.h"
 #include "qm_rps/judge/judgementtext.h"
 #include "qm_rps/judgedevaluation.h"
+#include "qm_rps/pushover/report/pushoverintro.h"
 #include "qm_rps/pushover/report/pushoverreport.h"
 #include "qm_rps/pushovercalculators.h"
 #include "json/judgementjson.h"
@@ -115,6 +116,7 @@ EXIT_CODE WriteAll(CDBDoc& doc, const T_JUDGE_COMMAND& o,
     if (code == EXIT_CODE::Done && !o.report.empty()) {
         std::string text;
         for (std::size_t i = 0; i < results.size(); ++i) {
+            if (!o.plain) text += PushoverIntroText(results[i], doc.Data().Model());
             text += PushoverReportText(results[i]) + JudgementText(judgements[i], 0);
             if (o.trace) text += JudgementTrace(judgements[i]);
         }

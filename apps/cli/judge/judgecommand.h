@@ -15,6 +15,7 @@ struct T_JUDGE_COMMAND {
     std::string level;                    // limit state; empty: all
     T_JUDGE_FACTORS factors;
     std::string json, report, sheet, csv, plot;
+    bool plain = false;              // the report without what it rests on
     bool trace = false, all = false; // all: rows on a terminal
     bool overwrite = false, noStore = false;
 };

@@ -29,7 +29,8 @@ void AddJudge(CLI::App& app, EXIT_CODE& code)
     sub->add_flag("--all-rows", o->all, Say("IDS_QM_HELP_JUDGE_ROWS"));
     sub->add_flag("--trace", o->trace, Say("IDS_QM_HELP_JUDGE_TRACE"));
     AddJson(sub, o->json);
-    sub->add_option("--report", o->report, Say("IDS_QM_HELP_JUDGE_REPORT"));
+    auto* const report = sub->add_option("--report", o->report, Say("IDS_QM_HELP_JUDGE_REPORT"));
+    sub->add_flag("--plain", o->plain, Say("IDS_QM_HELP_PLAIN"))->needs(report);
     sub->add_option("--sheet", o->sheet, Say("IDS_QM_HELP_JUDGE_SHEET"));
     sub->add_option("--csv", o->csv, Say("IDS_QM_HELP_JUDGE_CSV"));
     sub->add_option("--plot", o->plot, Say("IDS_QM_HELP_JUDGE_PLOT"));

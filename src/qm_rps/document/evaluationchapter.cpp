@@ -5,16 +5,10 @@
 #include "qm_rps/judge/judgementtext.h"
 #include "qm_rps/push/pushatpointtext.h"
 #include "qm_rps/pushover/explain/evaluationfacts.h"
+#include "qm_rps/pushover/explain/spectrumof.h"
 #include "qm_rps/pushover/report/pushovercells.h"
 
 namespace {
-
-const T_SPFC_D* SpectrumOf(const T_MODEL& model, const std::string& name)
-{
-    for (const auto& [key, spectrum] : model.spectra)
-        if (spectrum.name == name) return &spectrum;
-    return nullptr;
-}
 
 /// Bad: a limit state is not met. Warning: nothing was found, or nothing is known of a state.
 DOC_TONE ToneOf(const T_PUSH_EVALUATION& e)

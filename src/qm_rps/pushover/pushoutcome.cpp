@@ -2,6 +2,7 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/pushover/outcometext.h"
 
 #include <array>
 
@@ -62,6 +63,12 @@ std::string OutcomeName(const T_OUTCOME& outcome)
     if (const auto at = text.find(mark); at != std::string::npos)
         text.replace(at, mark.size(), std::to_string(outcome.count));
     return text;
+}
+
+std::string OutcomeText(const T_OUTCOME& outcome)
+{
+    return zql::lib::MMSGFunction::Format(kKeys[static_cast<std::size_t>(outcome.code)].name,
+                                          {std::to_string(outcome.count)});
 }
 
 std::string OutcomeAdvice(const T_OUTCOME& outcome)

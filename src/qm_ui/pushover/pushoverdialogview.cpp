@@ -68,7 +68,10 @@ void BuildUserDamping(CFormView& form, CPushOverCurveDampParamUser& m)
 
 void BuildPushOverText(CFormView& form, CPushOverTextDlg& m)
 {
-    form.Custom({}, MakeTextPage([&m] { return m.m_text; }, form.Host())).name = "text";
+    form.Custom({}, MakeTextPage([&m] { return m.Text(); }, form.Host())).name = "text";
+    auto& intro = form.Flag(KeyText("IDS_QM_UI_PUSH_WITH_INTRO"), Ref(m.m_withIntro));
+    intro.name = "intro";
+    intro.shown = [&m] { return !m.m_intro.empty(); };
     form.Button(KeyText("IDS_QM_UI_PUSH_SAVE_TEXT"), [&m] { m.OnSave(); }).name = "save";
     auto& saved = form.Note([&m] { return m.SavedPath(); });
     saved.name = "saved";

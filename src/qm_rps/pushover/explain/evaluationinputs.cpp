@@ -2,6 +2,7 @@
 #include "qm_base/textformat.h"
 #include "qm_db/recordfacts.h"
 #include "qm_rps/pushover/explain/evaluationfacts.h"
+#include "qm_rps/pushover/explain/spectrumof.h"
 
 namespace {
 
@@ -106,6 +107,13 @@ void AddTargetInputs(const T_PUSH_EVALUATION& e, std::vector<T_FACT>& out)
 }
 
 } // namespace
+
+const T_SPFC_D* SpectrumOf(const T_MODEL& model, const std::string& name)
+{
+    for (const auto& [key, spectrum] : model.spectra)
+        if (spectrum.name == name) return &spectrum;
+    return nullptr;
+}
 
 std::vector<T_FACT> InputsOf(const T_PUSH_EVALUATION& e, const T_SPFC_D* spectrum)
 {
