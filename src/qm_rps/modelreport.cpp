@@ -3,6 +3,7 @@
 #include "qm_base/say.h"
 #include "qm_rps/evaluatedsteps.h"
 #include "qm_rps/judgedevaluation.h"
+#include "qm_rps/push/casecheck.h"
 #include "qm_rps/push/pushresultlist.h"
 #include "qm_rps/push/pushwarnings.h"
 #include "qm_rps/pushovercalculators.h"
@@ -32,6 +33,8 @@ public:
         if (Asked(C::Evaluations) && Goes()) ReadHinges(out);
         if (Asked(C::Judgement)) Judge(out);
         if (Asked(C::Factors)) Solve(out);
+        if (Asked(C::Stages) && Goes()) AnalyseStages(out);
+        if (Asked(C::Remarks)) Check(out);
         return m_cancelled ? 0 : 1;
     }
 
@@ -116,14 +119,44 @@ private:
             const T_ULF_CALCULATION& calculation = dialog.Calculate();
             solved.result = calculation.result;
             if (!solved.result && calculation.said) solved.fault = calculation.said->text;
-            if (solved.result)
+            for (const T_FINDING& f : dialog.Warnings())
+                out.findings.emplace_back(item.name, f.text);
+            if (!solved.result) continue;
+            solved.checked = Checked(item, *calculation.run, *solved.result);
+            solved.stays = solved.checked.stays;
+            if (solved.stays.empty())
                 solved.stays = CUnknownLoadFactorResultDlg(m_doc, *solved.result).Stays();
         }
+    }
+    T_ULF_CHECKED Checked(const T_ULFI_D&, const T_ULF_RUN& run, const T_ULF_RESULT& result)
+    {
+        return CheckUlf(m_doc, run, result);
+    }
+    T_ULF_CHECKED Checked(const T_ULSI_D& item, const T_ULF_RUN& run, const T_ULF_RESULT& result)
+    {
+        return CheckUlfStages(m_doc, item, run, result);
     }
     void Solve(T_REPORT_DATA& out)
     {
         SolveAll<CUnknownLoadFactorItemDlg>(m_doc.Data().Model().ulfItems, out);
         SolveAll<CUnknownStageItemDlg>(m_doc.Data().Model().ulfStageItems, out);
+    }
+
+    /// The results that the chapter reads, where there are none of the model as it is.
+    void AnalyseStages(T_REPORT_DATA& out)
+    {
+        if (m_doc.Data().Model().stages.empty() || m_doc.Post().CheckStagedResult()) return;
+        T_ANALYSIS_OPTIONS options;
+        options.allCases = false;
+        options.progress = [this](std::size_t, std::size_t) { return Tell({}); };
+        T_ANALYSIS_ERROR error;
+        if (!m_doc.RunAnalysis(options, error)) out.stageFault = error.text;
+    }
+
+    void Check(T_REPORT_DATA& out)
+    {
+        for (const T_CASE_REMARK& remark : CheckCase(m_doc))
+            out.findings.emplace_back(remark.where, remark.finding.text);
     }
 
     CDBDoc& m_doc;

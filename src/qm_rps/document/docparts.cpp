@@ -1,6 +1,7 @@
 #include "qm_rps/document/docparts.h"
 
 #include "qm_base/say.h"
+#include "qm_base/textformat.h"
 #include "qm_db/recordfacts.h"
 #include "qm_rps/generate/codehingerows.h"
 
@@ -13,15 +14,17 @@ bool IsNumber(CELL_KIND kind)
     return kind == CELL_KIND::Number;
 }
 
+bool IsNothing(const std::string& cell)
+{
+    return cell.empty() || cell == "0" || cell == "-";
+}
+
 /// Without the columns that are empty, or zero, in every row; the first one always stays.
 void DropEmpty(T_TEXT_TABLE& table)
 {
-    const auto isNothing = [](const std::string& cell) {
-        return cell.empty() || cell == "0" || cell == "-";
-    };
     for (std::size_t c = table.columns.size(); c-- > 1;) {
         const bool isEmpty =
-            std::ranges::all_of(table.rows, [&](const auto& row) { return isNothing(row[c]); });
+            std::ranges::all_of(table.rows, [&](const auto& row) { return IsNothing(row[c]); });
         if (!isEmpty) continue;
         const auto at = static_cast<std::ptrdiff_t>(c);
         table.columns.erase(table.columns.begin() + at);
@@ -30,34 +33,75 @@ void DropEmpty(T_TEXT_TABLE& table)
     }
 }
 
-std::string FlagText(const CRecordGrid& grid, std::size_t row, std::size_t column)
+/// Numbers of grids have every digit that is stored, so that they can be edited.
+std::string Rounded(const std::string& cell)
+{
+    const bool isWhole = cell.find_first_not_of("-0123456789") == std::string::npos;
+    const auto value = isWhole ? std::nullopt : ParseFinite(cell);
+    return value ? ReportNumber(*value) : cell;
+}
+
+std::string CellOf(const CRecordGrid& grid, std::size_t row, std::size_t column)
 {
     const std::string text = grid.CellText(row, column);
-    if (grid.Kind(column) != CELL_KIND::Flag) return text;
-    return text == "1" ? Say("IDS_QM_FACT_YES") : std::string();
+    if (grid.Kind(column) == CELL_KIND::Flag)
+        return text == "1" ? Say("IDS_QM_FACT_YES") : std::string();
+    return IsNumber(grid.Kind(column)) ? Rounded(text) : text;
+}
+
+/// Values of materials and dimensions of sections that are zero have not been given.
+bool ZeroIsNone(EXPLORER_TABLE kind)
+{
+    return kind == EXPLORER_TABLE::Materials || kind == EXPLORER_TABLE::Sections;
+}
+
+std::string RowsText(std::size_t from, std::size_t to, std::size_t all)
+{
+    return " (" +
+           Say("IDS_QM_REPORT_ROWS", std::to_string(from), std::to_string(to),
+               std::to_string(all)) +
+           ")";
 }
 
 } // namespace
+
+std::string ReportNumber(double value)
+{
+    return FormatText("%.7g", value + 0.0);
+}
+
+std::string Capital(std::string text)
+{
+    if (!text.empty() && text[0] >= 'a' && text[0] <= 'z')
+        text[0] = static_cast<char>(text[0] - 'a' + 'A');
+    return text;
+}
 
 T_DOC_TEXT DocText(std::string text, DOC_TONE tone)
 {
     return {std::move(text), tone};
 }
 
-T_DOC_TEXT DocMono(std::string text)
+bool HasDefinitions(const T_DOC_FACTS& facts)
 {
-    while (text.ends_with('\n') || text.ends_with(' '))
-        text.pop_back();
-    return {std::move(text), DOC_TONE::Plain, true};
+    return std::ranges::any_of(facts.facts, [](const T_FACT& f) { return !f.definition.empty(); });
+}
+
+bool HasSymbols(const T_DOC_FACTS& facts)
+{
+    return std::ranges::any_of(facts.facts, [](const T_FACT& f) { return !f.symbol.empty(); });
 }
 
 T_DOC_TABLE DocTable(std::string caption, T_TEXT_TABLE table, T_TABLE_LIMIT limit)
 {
     const std::size_t all = table.rows.size();
     if (limit.most > 0 && all > limit.most) {
-        table.rows.resize(limit.most);
-        caption +=
-            " (" + Say("IDS_QM_REPORT_ROWS", std::to_string(limit.most), std::to_string(all)) + ")";
+        const std::size_t last = std::min(limit.last, limit.most);
+        const auto first = static_cast<std::ptrdiff_t>(limit.most - last);
+        table.rows.erase(table.rows.begin() + first,
+                         table.rows.end() - static_cast<std::ptrdiff_t>(last));
+        if (limit.most > last) caption += RowsText(1, limit.most - last, all);
+        if (last > 0) caption += RowsText(all - last + 1, all, all);
     }
     return {std::move(caption), std::move(table)};
 }
@@ -72,14 +116,14 @@ T_DOC_TABLE RecordsTable(CDBDoc& doc, EXPLORER_TABLE kind, T_TABLE_LIMIT limit)
     for (std::size_t r = 0; r < rows; ++r) {
         auto& row = table.rows.emplace_back();
         for (std::size_t c = 0; c < grid->Columns(); ++c)
-            row.push_back(FlagText(*grid, r, c));
+            row.push_back(CellOf(*grid, r, c));
     }
     DropEmpty(table);
+    if (ZeroIsNone(kind))
+        for (auto& row : table.rows)
+            std::ranges::replace(row, std::string("0"), std::string("-"));
     std::string caption = Say(TitleKey(kind));
-    if (rows < grid->Rows())
-        caption += " (" +
-                   Say("IDS_QM_REPORT_ROWS", std::to_string(rows), std::to_string(grid->Rows())) +
-                   ")";
+    if (rows < grid->Rows()) caption += RowsText(1, rows, grid->Rows());
     return {std::move(caption), std::move(table)};
 }
 

@@ -2,10 +2,10 @@
 #pragma once
 
 #include "qm_db/records.h"
-#include "qm_rps/factors/ulfiteration.h"
+#include "qm_rps/factors/ulfresult.h"
 #include "qm_rps/judge/judgementresult.h"
 #include "qm_rps/push/pushrun.h"
-#include "qm_rps/pushover/pushevaluation.h"
+#include "qm_rps/pushover/evaluation/pushovercomparison.h"
 
 #include <memory>
 #include <string>
@@ -40,11 +40,29 @@ struct T_JUDGEMENT_VIEW {
     std::size_t state = 0;
 };
 
-using T_DOC_VIEW = std::variant<T_FRAME_VIEW, T_SECTION_VIEW, T_BACKBONE_VIEW, T_PUSH_VIEW,
-                                T_EVALUATION_VIEW, T_JUDGEMENT_VIEW>;
+/// Evaluations of one load case by one spectrum on their capacity curve.
+struct T_COMPARISON_VIEW {
+    std::shared_ptr<const T_PUSH_COMPARISON> comparison;
+};
+/// Lengths beside each other, the first on top.
+struct T_BARS_VIEW {
+    std::string title, axis; // axis: with its unit
+    std::vector<std::pair<std::string, double>> bars;
+};
+/// Constrained quantities between their bounds.
+struct T_FACTORS_VIEW {
+    std::shared_ptr<const T_ULF_RESULT> result;
+};
+
+using T_DOC_VIEW =
+    std::variant<T_FRAME_VIEW, T_SECTION_VIEW, T_BACKBONE_VIEW, T_PUSH_VIEW, T_EVALUATION_VIEW,
+                 T_JUDGEMENT_VIEW, T_COMPARISON_VIEW, T_BARS_VIEW, T_FACTORS_VIEW>;
+
+/// Width of pictures that stand beside each other.
+inline constexpr double kHalfPage = 0.49;
 
 struct T_DOC_PICTURE {
     std::string caption;
     T_DOC_VIEW view;
-    double width = 1.0; // fraction of the page's
+    double width = 1.0; // fraction of the page's; small ones are drawn with texts of the same size
 };

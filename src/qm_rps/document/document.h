@@ -6,7 +6,9 @@
 #include "qm_rps/document/docpicture.h"
 #include "qm_rps/pushover/explain/fact.h"
 
+#include <array>
 #include <string>
+#include <string_view>
 #include <variant>
 #include <vector>
 
@@ -16,7 +18,6 @@ enum class DOC_TONE { Plain, Good, Bad, Warning };
 struct T_DOC_TEXT {
     std::string text;
     DOC_TONE tone = DOC_TONE::Plain;
-    bool mono = false; // columns by blanks: a fixed-width font, lines as they are
 };
 
 struct T_DOC_TABLE {
@@ -29,6 +30,10 @@ struct T_DOC_FACTS {
     std::string caption;
     std::vector<T_FACT> facts;
 };
+
+/// Lines of a code's trace have no definitions; inputs have no symbols.
+bool HasDefinitions(const T_DOC_FACTS& facts);
+bool HasSymbols(const T_DOC_FACTS& facts);
 
 using T_DOC_BLOCK = std::variant<T_DOC_TEXT, T_DOC_TABLE, T_DOC_FACTS, T_DOC_PICTURE>;
 
@@ -43,6 +48,14 @@ struct T_DOC_HEAD_ROW {
     std::string name, value;
 };
 
+/// Words that printers add.
+struct T_DOC_WORDS {
+    /// Heads of facts: symbol, what it is, value, formula, source.
+    std::array<std::string, 5> factHeads{};
+    std::string page; // "Page {1} of {2}"
+    std::string cut;  // behind what is too long for a page: "... ({1} characters in all)"
+};
+
 struct T_DOCUMENT {
     std::string language; // "en", "it"
     std::string title, subtitle;
@@ -51,8 +64,13 @@ struct T_DOCUMENT {
     std::string contents; // "Contents"
     std::vector<T_DOC_CHAPTER> chapters;
     std::vector<std::string> signOff; // who signs, one line each
-    std::string signOffTitle, page;   // "Sign-off"; "Page {1} of {2}"
+    std::string signOffTitle;
+    T_DOC_WORDS words;
 };
+
+/// A text as a document may hold it: what is no UTF-8, control characters but tab and line feed,
+/// and those that turn the direction of what follows are U+FFFD. Letters of any script stay.
+std::string CleanText(std::string_view text);
 
 /// "1", "1.2": the number of a chapter from those of its place.
 std::string ChapterNumber(const std::vector<std::size_t>& place);

@@ -25,9 +25,12 @@ th{background:var(--head)}td.n,th.n{text-align:right;font-variant-numeric:tabula
 .block td:first-child{color:var(--soft);min-width:11rem}.block td:last-child{min-width:16rem}
 td.c{color:var(--soft);font-size:.78rem}td.f{font-family:"DejaVu Sans Mono",monospace;
 font-size:.78rem}
-pre{font:12px/1.35 "DejaVu Sans Mono",monospace;overflow-x:auto;white-space:pre;margin:.5rem 0}
 .good{color:var(--good)}.bad{color:var(--bad);font-weight:bold}.warn{color:var(--warn)}
-figure{margin:1rem 0;break-inside:avoid}figure svg{width:100%;height:auto;background:#fff}
+figure{margin:1rem 0;break-inside:avoid}
+figure.half{display:inline-block;width:49%;margin-right:.5%;
+vertical-align:top}
+h1,h2,h3,td,p,li,figcaption,caption{overflow-wrap:anywhere}
+figure svg{width:100%;height:auto;background:#fff}
 figcaption{color:var(--soft);font-size:.84rem}
 nav ol{list-style:none;padding-left:1.2rem}nav>ol{padding-left:0}a{color:var(--key);
 text-decoration:none}
@@ -58,13 +61,11 @@ std::string Open(const char* tag, const std::string& classes)
 /// Writes the blocks of a document.
 class CHtmlWriter {
 public:
-    explicit CHtmlWriter(const DOC_SVG_FN& svg) : m_svg(svg) {}
+    CHtmlWriter(const T_DOC_WORDS& words, const DOC_SVG_FN& svg) : m_words(words), m_svg(svg) {}
 
     void operator()(const T_DOC_TEXT& t)
     {
-        const char* const tag = t.mono ? "pre" : "p";
-        m_out +=
-            Open(tag, ClassOf(t.tone)) + SignOf(t.tone) + HtmlText(t.text) + "</" + tag + ">\n";
+        m_out += Open("p", ClassOf(t.tone)) + SignOf(t.tone) + HtmlText(t.text) + "</p>\n";
     }
 
     void operator()(const T_DOC_TABLE& t)
@@ -90,9 +91,9 @@ public:
     {
         m_out += "<div class=\"wide\"><table>";
         Caption(t.caption);
+        const bool defined = HasDefinitions(t);
+        if (HasSymbols(t)) FactHead(defined);
         m_out += "<tbody>\n";
-        const bool defined =
-            std::ranges::any_of(t.facts, [](const T_FACT& f) { return !f.definition.empty(); });
         for (const T_FACT& f : t.facts)
             Fact(f, defined);
         m_out += "</tbody></table></div>\n";
@@ -102,10 +103,8 @@ public:
     {
         const std::string svg = m_svg ? m_svg(p) : std::string();
         if (svg.empty()) return;
-        constexpr double kPercent = 100.0;
-        m_out +=
-            "<figure style=\"max-width:" + std::to_string(static_cast<int>(p.width * kPercent)) +
-            "%\">" + svg + "<figcaption>" + HtmlText(p.caption) + "</figcaption></figure>\n";
+        m_out += Open("figure", p.width < 1.0 ? "half" : "") + svg + "<figcaption>" +
+                 HtmlText(p.caption) + "</figcaption></figure>\n";
     }
 
     void Chapter(const T_DOC_CHAPTER& chapter, std::vector<std::size_t> place)
@@ -130,9 +129,25 @@ private:
     {
         if (!text.empty()) m_out += "<caption>" + HtmlText(text) + "</caption>";
     }
+    void FactHead(bool defined)
+    {
+        m_out += "<thead><tr>";
+        for (std::size_t c = 0; c < m_words.factHeads.size(); ++c)
+            if (c != kDefinition || defined)
+                m_out +=
+                    Open("th", c == kValue ? "n" : "") + HtmlText(m_words.factHeads[c]) + "</th>";
+        m_out += "</tr></thead>\n";
+    }
+    /// An input: its name and what was taken.
+    void Input(const T_FACT& f)
+    {
+        m_out +=
+            "<tr><td>" + HtmlText(f.definition) + "</td><td>" + HtmlText(f.text) + "</td></tr>\n";
+    }
     /// defined: some line of the table has a definition.
     void Fact(const T_FACT& f, bool defined)
     {
+        if (f.symbol.empty() && !f.value) return Input(f);
         std::string derived = HtmlText(f.formula);
         if (!f.numbers.empty()) derived += "<br>= " + HtmlText(f.numbers);
         if (f.value && !f.text.empty())
@@ -145,6 +160,8 @@ private:
                  "</td></tr>\n";
     }
 
+    static constexpr std::size_t kDefinition = 1, kValue = 2; // of the heads of facts
+    const T_DOC_WORDS& m_words;
     const DOC_SVG_FN& m_svg;
 };
 
@@ -187,7 +204,7 @@ std::string SignOff(const T_DOCUMENT& d)
 std::string HtmlText(std::string_view text)
 {
     std::string out;
-    for (const char c : text) {
+    for (const char c : CleanText(text)) {
         if (c == '&')
             out += "&amp;";
         else if (c == '<')
@@ -198,8 +215,6 @@ std::string HtmlText(std::string_view text)
             out += "&quot;";
         else if (c == '\'')
             out += "&#39;";
-        else if (static_cast<unsigned char>(c) < 0x20U && c != '\n' && c != '\t')
-            out += "\uFFFD";
         else
             out += c;
     }
@@ -208,7 +223,7 @@ std::string HtmlText(std::string_view text)
 
 std::string HtmlOf(const T_DOCUMENT& d, const DOC_SVG_FN& svg)
 {
-    CHtmlWriter writer(svg);
+    CHtmlWriter writer(d.words, svg);
     writer.m_out = "<!DOCTYPE html>\n<html lang=\"" + HtmlText(d.language) +
                    "\">\n<head>\n<meta charset=\"utf-8\">\n<meta name=\"viewport\" "
                    "content=\"width=device-width, initial-scale=1\">\n<meta name=\"generator\" "

@@ -12,6 +12,5 @@ using DOC_SVG_FN = std::function<std::string(const T_DOC_PICTURE&)>;
 /// The whole file, UTF-8. Every text is escaped. The same document gives the same bytes.
 std::string HtmlOf(const T_DOCUMENT& document, const DOC_SVG_FN& svg);
 
-/// Text between tags: &, <, > and quotes are written as entities; characters that no document may
-/// hold as U+FFFD.
+/// CleanText between tags: &, <, > and quotes are written as entities.
 std::string HtmlText(std::string_view text);

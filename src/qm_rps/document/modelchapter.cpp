@@ -1,4 +1,4 @@
-// What stands before any analysis: the model, its loads, its modes.
+// The model: overview, picture, sections, materials, nodes, elements, storeys.
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
 #include "qm_db/recordfacts.h"
@@ -26,28 +26,24 @@ T_DOC_TEXT Overview(const T_REPORT_WORK& work)
     return DocText(text);
 }
 
-/// Sum of the lumped masses of free directions.
-T_DOC_TEXT TotalMass(const T_REPORT_WORK& work)
+/// Sum of the lumped masses of free directions; nothing where no node has any.
+void AddTotalMass(const T_REPORT_WORK& work, T_DOC_CHAPTER& to)
 {
     std::array<double, 3> sum{};
     for (const auto& [id, node] : work.Model().nodes)
         for (std::size_t d = 0; d < sum.size(); ++d)
             sum[d] += node.mass[d];
+    if (sum == std::array<double, 3>{}) return;
     const auto shown = [&](double si) {
         return FormatText("%.6g", FromSi(si, work.Units(), kDimMass));
     };
-    return DocText(Say("IDS_QM_REPORT_TOTAL_MASS", shown(sum[0]), shown(sum[1]), shown(sum[2]),
-                       std::string(NameOf(work.Units().force)) + " s2/" +
-                           std::string(NameOf(work.Units().length))));
+    to.blocks.emplace_back(
+        DocText(Say("IDS_QM_REPORT_TOTAL_MASS", shown(sum[0]), shown(sum[1]), shown(sum[2]),
+                    std::string(NameOf(work.Units().force)) + " s2/" +
+                        std::string(NameOf(work.Units().length)))));
 }
 
-void AddTable(T_REPORT_WORK& work, EXPLORER_TABLE kind, T_DOC_CHAPTER& to)
-{
-    if (RecordCount(work.doc, kind) > 0)
-        to.blocks.emplace_back(RecordsTable(work.doc, kind, work.limit));
-}
-
-/// Properties that the analysis takes, those of shapes worked out.
+/// Properties that the analysis takes, those of shapes worked out. Zero: not given, or not in play.
 T_TEXT_TABLE SectionValues(const T_REPORT_WORK& work)
 {
     struct T_COLUMN {
@@ -70,8 +66,9 @@ T_TEXT_TABLE SectionValues(const T_REPORT_WORK& work)
         SECT_FAULT fault{};
         const bool sound = CSectionProperties::Calc(section, full, fault) != 0;
         for (const T_COLUMN& c : columns)
-            row.push_back(sound ? FormatText("%.6g", FromSi(full.*c.value, work.Units(), c.dim))
-                                : "-");
+            row.push_back(sound && full.*c.value != 0.0
+                              ? ReportNumber(FromSi(full.*c.value, work.Units(), c.dim))
+                              : "-");
     }
     return table;
 }
@@ -81,10 +78,9 @@ void AddSections(T_REPORT_WORK& work, T_DOC_CHAPTER& chapter)
     if (work.Model().sections.empty()) return;
     T_DOC_CHAPTER& part = chapter.parts.emplace_back();
     part.title = Say("IDS_QM_REPORT_SECTIONS");
-    AddTable(work, EXPLORER_TABLE::Sections, part);
+    AddRecords(work, EXPLORER_TABLE::Sections, part);
     part.blocks.emplace_back(
         DocTable(Say("IDS_QM_REPORT_SECTION_VALUES"), SectionValues(work), work.limit));
-    constexpr double kWidth = 0.5;
     constexpr std::size_t kMostPictures = 24;
     std::size_t count = 0;
     for (const auto& [key, section] : work.Model().sections) {
@@ -92,7 +88,7 @@ void AddSections(T_REPORT_WORK& work, T_DOC_CHAPTER& chapter)
         T_SECT_D shown;
         if (work.doc.Attr().GetSect(key, shown))
             part.blocks.emplace_back(
-                T_DOC_PICTURE{section.name, T_SECTION_VIEW{shown, work.Units()}, kWidth});
+                T_DOC_PICTURE{section.name, T_SECTION_VIEW{shown, work.Units()}, kHalfPage});
     }
     if (count > kMostPictures)
         part.blocks.emplace_back(DocText(Say(
@@ -129,11 +125,21 @@ void AddMaterials(T_REPORT_WORK& work, T_DOC_CHAPTER& chapter)
     if (work.Model().materials.empty()) return;
     T_DOC_CHAPTER& part = chapter.parts.emplace_back();
     part.title = Say("IDS_QM_REPORT_MATERIALS");
-    AddTable(work, EXPLORER_TABLE::Materials, part);
+    AddRecords(work, EXPLORER_TABLE::Materials, part);
     T_TEXT_TABLE assessed = AssessedValues(work);
     if (!assessed.rows.empty())
         part.blocks.emplace_back(
             DocTable(Say("IDS_QM_REPORT_ASSESSED"), std::move(assessed), work.limit));
+}
+
+/// The frame, with its numbers where they can be read.
+void AddFrame(const T_REPORT_WORK& work, T_DOC_CHAPTER& chapter)
+{
+    constexpr std::size_t kMostNumbers = 150;
+    const bool numbers = work.Model().nodes.size() + work.Model().elements.size() <= kMostNumbers;
+    chapter.blocks.emplace_back(
+        T_DOC_PICTURE{Say(numbers ? "IDS_QM_REPORT_FRAME_NUMBERS" : "IDS_QM_REPORT_FRAME_PICTURE"),
+                      T_FRAME_VIEW{numbers}});
 }
 
 } // namespace
@@ -141,106 +147,13 @@ void AddMaterials(T_REPORT_WORK& work, T_DOC_CHAPTER& chapter)
 void FillModelChapter(T_REPORT_WORK& work, T_DOC_CHAPTER& chapter)
 {
     chapter.blocks.emplace_back(Overview(work));
-    if (!work.Model().elements.empty())
-        chapter.blocks.emplace_back(
-            T_DOC_PICTURE{Say("IDS_QM_REPORT_FRAME_PICTURE"), T_FRAME_VIEW{}});
+    if (!work.Model().elements.empty()) AddFrame(work, chapter);
     AddSections(work, chapter);
     AddMaterials(work, chapter);
     T_DOC_CHAPTER nodes{Say("IDS_QM_REPORT_GEOMETRY")};
     for (const EXPLORER_TABLE kind :
          {EXPLORER_TABLE::Nodes, EXPLORER_TABLE::Elements, EXPLORER_TABLE::Storeys})
-        AddTable(work, kind, nodes);
-    if (!work.Model().nodes.empty()) nodes.blocks.emplace_back(TotalMass(work));
+        AddRecords(work, kind, nodes);
+    AddTotalMass(work, nodes);
     if (!nodes.blocks.empty()) chapter.parts.push_back(std::move(nodes));
-}
-
-namespace {
-
-/// A load of a case in one line.
-T_TEXT_TABLE LoadRows(const T_REPORT_WORK& work, const T_STLD_D& c)
-{
-    T_TEXT_TABLE table{{{Say("IDS_QM_REPORT_LOAD")},
-                        {Say("IDS_QM_REPORT_LOAD_AT")},
-                        {Say("IDS_QM_REPORT_LOAD_VALUES")}},
-                       {}};
-    const std::string L(NameOf(work.Units().length)), F(NameOf(work.Units().force));
-    const auto add = [&](const char* what, const char* where, int id, std::string values) {
-        table.rows.push_back({Say(what), Say(where) + " " + std::to_string(id), std::move(values)});
-    };
-    const auto list = [](std::span<const double> values, std::span<const char* const> names,
-                         const auto& unitOf) {
-        std::string text;
-        for (std::size_t i = 0; i < values.size(); ++i)
-            if (values[i] != 0.0)
-                text += (text.empty() ? "" : ", ") + std::string(names[i]) + " " +
-                        FormatText("%.6g", values[i]) + " " + unitOf(i);
-        return text.empty() ? std::string("0") : text;
-    };
-    const auto forceUnit = [&](std::size_t i) { return i < 3 ? F : F + " " + L; };
-    const auto moveUnit = [&](std::size_t i) { return i < 3 ? L : std::string("rad"); };
-    for (const T_NODAL_LOAD& l : c.nodal)
-        add("IDS_QM_REPORT_NODAL_LOAD", "IDS_QM_NOUN_NODE", l.node,
-            list(l.load, kReactionNames, forceUnit));
-    for (const T_BEAM_LOAD& l : c.beam) {
-        const std::string axes = kLoadAxesNames[static_cast<std::size_t>(l.axes)],
-                          direction = kLoadDirectionNames[static_cast<std::size_t>(l.direction)];
-        const bool spread = l.type == BEAM_LOAD_TYPE::Distributed;
-        const std::string unit = spread                             ? F + "/" + L
-                                 : l.type == BEAM_LOAD_TYPE::Moment ? F + " " + L
-                                                                    : F;
-        std::string values = kBeamLoadNames[static_cast<std::size_t>(l.type)] +
-                             (" " + axes + " " + direction + ": ") + FormatText("%.6g", l.w[0]);
-        if (spread && l.w[1] != l.w[0]) values += " ... " + FormatText("%.6g", l.w[1]);
-        values += " " + unit;
-        if (!spread)
-            values += FormatText(" (x/L = %.4g)", l.at[0]);
-        else if (l.at[0] != 0.0 || l.at[1] != 1.0)
-            values += FormatText(" (x/L = %.4g ... %.4g)", l.at[0], l.at[1]);
-        add("IDS_QM_REPORT_BEAM_LOAD", "IDS_QM_NOUN_ELEMENT", l.element, values);
-    }
-    for (const T_SETTLEMENT& l : c.settlement)
-        add("IDS_QM_REPORT_SETTLEMENT", "IDS_QM_NOUN_NODE", l.node,
-            list(l.displacement, kDirectionNames, moveUnit));
-    for (const T_TEMPERATURE_LOAD& l : c.temperature)
-        add("IDS_QM_REPORT_TEMPERATURE", "IDS_QM_NOUN_ELEMENT", l.element,
-            FormatText("%.6g K", l.change));
-    for (const T_PTNS_D& l : c.pretension)
-        add("IDS_QM_REPORT_PRETENSION", "IDS_QM_NOUN_ELEMENT", l.element,
-            FormatText("%.6g ", l.force) + F);
-    return table;
-}
-
-} // namespace
-
-void FillLoadsChapter(T_REPORT_WORK& work, T_DOC_CHAPTER& chapter)
-{
-    AddTable(work, EXPLORER_TABLE::LoadCases, chapter);
-    for (const int key : work.doc.Attr().GetStldKeys()) {
-        T_STLD_D c;
-        if (!work.doc.Attr().GetStld(key, c)) continue;
-        T_TEXT_TABLE rows = LoadRows(work, c);
-        if (!rows.rows.empty())
-            chapter.blocks.emplace_back(DocTable(c.name, std::move(rows), work.limit));
-    }
-    AddTable(work, EXPLORER_TABLE::Combinations, chapter);
-}
-
-void FillModesChapter(T_REPORT_WORK& work, T_DOC_CHAPTER& chapter)
-{
-    if (work.Model().modes.empty()) return;
-    T_TEXT_TABLE table{{{Say("IDS_QM_REPORT_MODE"), true}, {"T (s)", true}, {"f (Hz)", true}}, {}};
-    for (const char* const direction : kDirectionNames)
-        table.columns.push_back({std::string("m ") + direction + " (%)", true});
-    bool any = false;
-    for (const auto& [number, mode] : work.Model().modes) {
-        auto& row = table.rows.emplace_back(std::vector<std::string>{
-            std::to_string(number), FormatText("%.5g", mode.period),
-            mode.period > 0.0 ? FormatText("%.5g", 1.0 / mode.period) : "-"});
-        any = any || mode.massPercent;
-        for (std::size_t d = 0; d < 6; ++d)
-            row.push_back(mode.massPercent ? FormatText("%.4g", (*mode.massPercent)[d]) : "-");
-    }
-    chapter.blocks.emplace_back(
-        DocTable(Say("IDS_QM_REPORT_MODES_TABLE"), std::move(table), work.limit));
-    if (!any) chapter.blocks.emplace_back(DocText(Say("IDS_QM_REPORT_NO_MODAL_MASS")));
 }

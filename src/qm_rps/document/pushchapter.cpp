@@ -9,6 +9,12 @@
 
 namespace {
 
+// By the number of the pattern and by kPDeltaNames.
+constexpr std::array kPatternTexts{"IDS_PUSHOVER_Static_Load", "IDS_PUSHOVER_Accerelation",
+                                   "IDS_PUSHOVER_Mode_Shape", "IDS_PUSHOVER_Mode_Shape_Story_Mass"};
+constexpr std::array kPDeltaTexts{"IDS_QM_REPORT_NO_LOADS", "IDS_QM_REPORT_PDELTA_INITIAL",
+                                  "IDS_QM_REPORT_PDELTA_UPDATED"};
+
 std::string InitialLoadsText(const T_MODEL& model, const std::vector<T_PUSH_INITIAL_LOAD>& loads)
 {
     std::string text;
@@ -42,11 +48,31 @@ T_TEXT_TABLE SetupTable(const T_REPORT_WORK& work)
                       : Say("IDS_QM_REPORT_OTHER_PROGRAM");
         table.rows.push_back(
             {c.name, std::to_string(c.controlNode) + ", " + kDirectionNames[direction],
-             kPatternNames[pattern], target, std::to_string(c.steps.value_or(global.steps)),
+             Say(kPatternTexts[pattern]), target, std::to_string(c.steps.value_or(global.steps)),
              InitialLoadsText(work.Model(), c.initialLoads.value_or(global.initialLoads)),
-             kPDeltaNames[static_cast<std::size_t>(c.pDelta.value_or(global.pDelta))]});
+             Say(kPDeltaTexts[static_cast<std::size_t>(c.pDelta.value_or(global.pDelta))])});
     }
     return table;
+}
+
+/// "C: 17 J My; unload: 1 I My, 1 J My".
+std::string EventText(const T_PUSH_RUN& run, const T_PUSH_EVENT_ROW& event)
+{
+    std::vector<std::pair<std::string, std::string>> byPoint;
+    for (const auto& hinge : event.hinges) {
+        const T_PUSH_LAW_PLACE& place = run.hinges.at(hinge.hinge).place;
+        const std::string name = std::to_string(place.element) + " " + place.end + " " +
+                                 kComponentNames[static_cast<std::size_t>(place.component)];
+        const auto at = std::ranges::find(byPoint, hinge.to, [](const auto& p) { return p.first; });
+        if (at == byPoint.end())
+            byPoint.emplace_back(hinge.to, name);
+        else
+            at->second += ", " + name;
+    }
+    std::string text = event.initial ? Say("IDS_QM_REPORT_INITIAL") + ": " : std::string();
+    for (std::size_t i = 0; i < byPoint.size(); ++i)
+        text += (i ? "; " : "") + byPoint[i].first + ": " + byPoint[i].second;
+    return text;
 }
 
 T_TEXT_TABLE EventTable(const T_REPORT_WORK& work, const T_PUSH_RUN& run)
@@ -60,18 +86,11 @@ T_TEXT_TABLE EventTable(const T_REPORT_WORK& work, const T_PUSH_RUN& run)
                         {"V (" + UnitText(react, units) + ")", true},
                         {Say("IDS_QM_REPORT_EVENT")}},
                        {}};
-    for (const T_PUSH_EVENT_ROW& event : run.events) {
-        std::string what = event.initial ? Say("IDS_QM_REPORT_INITIAL") + ": " : std::string();
-        for (std::size_t i = 0; i < event.hinges.size(); ++i) {
-            const T_PUSH_LAW_PLACE& place = run.hinges.at(event.hinges[i].hinge).place;
-            what += (i ? "; " : "") + std::to_string(place.element) + " " + place.end + " " +
-                    kComponentNames[static_cast<std::size_t>(place.component)] + ": " +
-                    event.hinges[i].to;
-        }
+    for (const T_PUSH_EVENT_ROW& event : run.events)
         table.rows.push_back({FormatText("%.6g", event.loadFactor),
                               FormatText("%.6g", FromSi(event.displacement, units, move)),
-                              FormatText("%.6g", FromSi(event.baseReaction, units, react)), what});
-    }
+                              FormatText("%.6g", FromSi(event.baseReaction, units, react)),
+                              EventText(run, event)});
     return table;
 }
 
@@ -99,7 +118,7 @@ void AddRun(T_REPORT_WORK& work, const T_PUSH_RUN& run, T_DOC_CHAPTER& chapter)
     T_DOC_CHAPTER& part = chapter.parts.emplace_back();
     part.title = run.name;
     const DOC_TONE tone = run.status == PUSH_STATUS::Failed ? DOC_TONE::Warning : DOC_TONE::Plain;
-    part.blocks.emplace_back(DocText(run.outcome + ". " + run.advice, tone));
+    part.blocks.emplace_back(DocText(run.advice, tone));
     if (run.status == PUSH_STATUS::Failed) work.Remark(run.name, run.advice);
     for (const std::string& warning : run.warnings) {
         part.blocks.emplace_back(DocText(warning, DOC_TONE::Warning));

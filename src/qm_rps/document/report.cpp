@@ -59,7 +59,11 @@ void FillHead(const T_REPORT_WORK& work, T_DOCUMENT& out)
     out.head = HeadRows(work);
     out.contents = Say("IDS_QM_REPORT_CONTENTS");
     out.signOffTitle = Say("IDS_QM_REPORT_SIGN_OFF");
-    out.page = zql::lib::MMSGFunction::GetValue("IDS_QM_REPORT_PAGE");
+    out.words = {{Say("IDS_QM_REPORT_FACT_SYMBOL"), Say("IDS_QM_REPORT_FACT_WHAT"),
+                  Say("IDS_QM_REPORT_FACT_VALUE"), Say("IDS_QM_REPORT_FACT_HOW"),
+                  Say("IDS_QM_REPORT_FACT_SOURCE")},
+                 zql::lib::MMSGFunction::GetValue("IDS_QM_REPORT_PAGE"),
+                 zql::lib::MMSGFunction::GetValue("IDS_QM_REPORT_CUT")};
     out.signOff = {Say("IDS_QM_REPORT_AUTHOR"), Say("IDS_QM_REPORT_CHECKER"),
                    Say("IDS_QM_REPORT_APPROVED")};
 }
@@ -102,8 +106,15 @@ std::optional<std::vector<REPORT_CHAPTER>> ChaptersNamed(const std::string& list
 
 void T_REPORT_WORK::Remark(const std::string& where, const std::string& text)
 {
-    const std::string line = where.empty() ? text : where + ": " + text;
-    if (std::ranges::count(remarks, line) == 0) remarks.push_back(line);
+    auto at = std::ranges::find(remarks, text, &T_REPORT_REMARK::text);
+    if (at == remarks.end()) at = remarks.insert(at, {text, {}});
+    if (!where.empty() && std::ranges::count(at->where, where) == 0) at->where.push_back(where);
+}
+
+void AddRecords(T_REPORT_WORK& work, EXPLORER_TABLE kind, T_DOC_CHAPTER& to)
+{
+    if (RecordCount(work.doc, kind) > 0)
+        to.blocks.emplace_back(RecordsTable(work.doc, kind, work.limit));
 }
 
 std::vector<REPORT_CHAPTER> ChosenChapters(const T_REPORT_OPTIONS& options)

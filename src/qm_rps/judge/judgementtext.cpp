@@ -194,14 +194,39 @@ std::vector<std::string> LimitCells(const T_JUDGEMENT& j, const T_JUDGED_LIMIT& 
             remark};
 }
 
+std::vector<std::string> LimitHeads(const T_UNITS& units)
+{
+    const std::string length = " (" + std::string(NameOf(units.length)) + ")";
+    return {Say("IDS_QM_JUDGE_LIMIT_STATE"),
+            Say("IDS_QM_JUDGE_GOVERNING"),
+            Say("IDS_QM_JUDGE_FIRST_END"),
+            Say("IDS_QM_JUDGE_CAPACITY") + length,
+            Say("IDS_QM_JUDGE_DEMAND") + length,
+            Say("IDS_QM_JUDGE_SHARE"),
+            "PGA_C/PGA_D",
+            "PGA_C (g)",
+            "PGA_D (g)",
+            ""};
+}
+
+/// A column of numbers has nothing else but dashes.
+T_TEXT_TABLE AsTable(const T_LINES& lines)
+{
+    T_TEXT_TABLE table;
+    for (std::size_t c = 0; c < lines.front().size(); ++c) {
+        const bool isNumber = std::all_of(lines.begin() + 1, lines.end(), [c](const auto& line) {
+            return line[c] == "-" || ParseFinite(line[c]);
+        });
+        table.columns.push_back({lines.front()[c], isNumber});
+    }
+    table.rows.assign(lines.begin() + 1, lines.end());
+    return table;
+}
+
 std::string LimitLines(const T_JUDGEMENT& j)
 {
     if (j.limits.empty()) return {};
-    const std::string length = " (" + std::string(NameOf(j.units.length)) + ")";
-    T_LINES lines{{Say("IDS_QM_JUDGE_LIMIT_STATE"), Say("IDS_QM_JUDGE_GOVERNING"),
-                   Say("IDS_QM_JUDGE_FIRST_END"), Say("IDS_QM_JUDGE_CAPACITY") + length,
-                   Say("IDS_QM_JUDGE_DEMAND") + length, Say("IDS_QM_JUDGE_SHARE"), "PGA_C/PGA_D",
-                   "PGA_C (g)", "PGA_D (g)", ""}};
+    T_LINES lines{LimitHeads(j.units)};
     for (const T_JUDGED_LIMIT& limit : j.limits)
         lines.push_back(LimitCells(j, limit));
     return "\n" + Say("IDS_QM_JUDGE_LIMITS") + '\n' + Table(lines);
@@ -268,6 +293,15 @@ std::string JudgedLimitsText(const T_JUDGEMENT& j)
     return text;
 }
 
+T_TEXT_TABLE JudgedLimitsTable(const T_JUDGEMENT& j)
+{
+    if (j.limits.empty()) return {};
+    T_LINES lines{LimitHeads(j.units)};
+    for (const T_JUDGED_LIMIT& limit : j.limits)
+        lines.push_back(LimitCells(j, limit));
+    return AsTable(lines);
+}
+
 std::string JudgementTrace(const T_JUDGEMENT& j)
 {
     std::string text;
@@ -283,15 +317,31 @@ std::string JudgementTrace(const T_JUDGEMENT& j)
     return text;
 }
 
-T_TEXT_TABLE JudgedTable(const T_JUDGEMENT& judgement, const T_JUDGED_STATE& state,
-                         std::size_t mostRows)
+std::vector<T_JUDGED_PART> JudgedParts(const T_JUDGEMENT& j, const T_JUDGED_STATE& state,
+                                       std::size_t mostRows)
 {
-    const T_LINES lines = RowsWithHead(judgement, state, mostRows);
-    T_TEXT_TABLE table;
-    for (std::size_t c = 0; c < lines.front().size(); ++c) {
-        const bool isNumber = lines.size() > 1 && (ParseFinite(lines[1][c]) || lines[1][c] == "-");
-        table.columns.push_back({lines.front()[c], isNumber});
+    constexpr std::array kPage{
+        C::Element,    C::End,   C::Axis,          C::Verdict,    C::Governing,  C::N,
+        C::M,          C::Theta, C::ThetaCapacity, C::ThetaRatio, C::Shear,      C::ShearCapacity,
+        C::ShearRatio, C::Other, C::OtherCapacity, C::OtherUnit,  C::OtherRatio, C::Clause,
+        C::Reason};
+    const auto heads = JudgedHeads(j.units);
+    std::vector<T_JUDGED_PART> parts;
+    for (const bool others : {false, true}) {
+        T_LINES lines(1);
+        std::vector<VERDICT> verdicts;
+        for (const C column : kPage)
+            lines.front().push_back(heads[static_cast<std::size_t>(column)]);
+        for (std::size_t i = 0; i < ShownRows(state, mostRows); ++i) {
+            const T_JUDGED_CELLS cells = CellsOf(j, state, state.rows[i]);
+            if (At(cells, C::Other).number.has_value() != others) continue;
+            std::vector<std::string>& line = lines.emplace_back();
+            for (const C column : kPage)
+                line.push_back(CellText(At(cells, column)));
+            verdicts.push_back(state.rows[i].verdict);
+        }
+        if (!verdicts.empty())
+            parts.push_back({AsTable(WithoutEmpty(lines, 1, kPage.size())), std::move(verdicts)});
     }
-    table.rows.assign(lines.begin() + 1, lines.end());
-    return table;
+    return parts;
 }

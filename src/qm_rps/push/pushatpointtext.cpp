@@ -20,55 +20,25 @@ std::string Padded(const std::string& text, int width)
     return text + std::string(static_cast<std::size_t>(std::max<std::ptrdiff_t>(gap, 0)), ' ');
 }
 
-/// "12 J My".
-std::string PlaceText(const T_PUSH_LAW_PLACE& place)
-{
-    return std::to_string(place.element) + " " + place.end + " " +
-           kComponentNames[static_cast<std::size_t>(place.component)];
-}
-
-/// "0.83 CP"; "-" without a ratio.
-std::string RatioText(const T_HINGE_AT_POINT& hinge)
-{
-    return hinge.ratio ? FormatText("%.3g %s", *hinge.ratio, RatioOf(hinge.place)) : "-";
-}
-
-std::string WorstText(const T_PUSH_AT_POINT& at)
-{
-    if (at.worst.empty()) return "-";
-    const T_HINGE_AT_POINT& worst = at.worst.front();
-    return PlaceText(worst.place) + ", " + PushStateText(worst.state) + ", " + RatioText(worst);
-}
-
-std::string DriftText(const T_PUSH_AT_POINT& at)
-{
-    const auto largest = std::ranges::max_element(
-        at.storeys, {}, [](const T_STOREY_AT_POINT& s) { return std::fabs(s.drift); });
-    if (largest == at.storeys.end()) return "-";
-    return FormatText("%.4g", largest->drift) + " (" + largest->name + ")";
-}
-
-using T_SEEN = std::array<bool, kPushStateNames.size()>;
-
-std::string PointLine(const T_PUSH_AT_POINT& at, const T_SEEN& seen, const T_UNITS& units)
+std::string PointLine(const T_PUSH_AT_POINT& at, const T_STATES_SEEN& seen, const T_UNITS& units)
 {
     std::string text = "  " + Padded(PointName(at.point), kNameWidth) +
                        FormatText(" %13.6g", FromSi(at.point.displacement, units, kDimLength));
     if (at.found != AT_POINT::Reached) return text + "  " + WhyNot(at.found) + "\n";
     for (std::size_t s = 0; s < seen.size(); ++s)
         if (seen[s]) text += FormatText(" %8zu", at.states[s]);
-    return text + "  " + Padded(WorstText(at), 36) + "  " + DriftText(at) + "\n";
+    return text + "  " + Padded(WorstHingeText(at), 36) + "  " + LargestDriftText(at) + "\n";
 }
 
 std::string WorstLines(const T_PUSH_AT_POINT& at, const T_UNITS& units)
 {
     std::string text;
     for (const T_HINGE_AT_POINT& h : at.worst)
-        text += "    " + Padded(PlaceText(h.place), 14) +
+        text += "    " + Padded(HingePlaceText(h.place), 14) +
                 FormatText(" %14.6g %14.6g  %-8s %s\n",
                            DeformationOf(h.place.component, units).Shown(h.deformation),
                            ForceOf(h.place.component, units).Shown(h.force),
-                           PushStateText(h.state).c_str(), RatioText(h).c_str());
+                           PushStateText(h.state).c_str(), HingeRatioText(h).c_str());
     return text;
 }
 
@@ -93,6 +63,42 @@ std::string Title(const T_HINGES_AT& h)
 }
 
 } // namespace
+
+std::string HingePlaceText(const T_PUSH_LAW_PLACE& place)
+{
+    return std::to_string(place.element) + " " + place.end + " " +
+           kComponentNames[static_cast<std::size_t>(place.component)];
+}
+
+std::string HingeRatioText(const T_HINGE_AT_POINT& hinge)
+{
+    return hinge.ratio ? FormatText("%.3g %s", *hinge.ratio, RatioOf(hinge.place)) : "-";
+}
+
+std::string WorstHingeText(const T_PUSH_AT_POINT& at)
+{
+    if (at.worst.empty()) return "-";
+    const T_HINGE_AT_POINT& worst = at.worst.front();
+    return HingePlaceText(worst.place) + ", " + PushStateText(worst.state) + ", " +
+           HingeRatioText(worst);
+}
+
+std::string LargestDriftText(const T_PUSH_AT_POINT& at)
+{
+    const auto largest = std::ranges::max_element(
+        at.storeys, {}, [](const T_STOREY_AT_POINT& s) { return std::fabs(s.drift); });
+    if (largest == at.storeys.end()) return "-";
+    return FormatText("%.4g", largest->drift) + " (" + largest->name + ")";
+}
+
+T_STATES_SEEN StatesSeen(const T_HINGES_AT& h)
+{
+    T_STATES_SEEN seen{};
+    for (const T_PUSH_AT_POINT& at : h.points)
+        for (std::size_t s = 0; s < seen.size(); ++s)
+            seen[s] = seen[s] || at.states[s] > 0;
+    return seen;
+}
 
 std::string PushStateText(PUSH_STATE state)
 {
@@ -123,10 +129,7 @@ std::string HingesAtTable(const T_HINGES_AT& h)
 {
     if (!h.note.empty()) return "\n" + Title(h) + "\n  " + h.note + "\n";
     if (h.points.empty()) return {};
-    T_SEEN seen{};
-    for (const T_PUSH_AT_POINT& at : h.points)
-        for (std::size_t s = 0; s < seen.size(); ++s)
-            seen[s] = seen[s] || at.states[s] > 0;
+    const T_STATES_SEEN seen = StatesSeen(h);
     std::string text = "\n" + Title(h) + "\n  " + Padded("", kNameWidth) +
                        FormatText(" %13s", Say("IDS_QM_CLI_PUSH_DISPLACEMENT").c_str());
     for (std::size_t s = 0; s < seen.size(); ++s)

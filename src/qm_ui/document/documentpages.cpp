@@ -3,6 +3,7 @@
 #include "qm_ui/document/pagetext.h"
 
 #include <QColor>
+#include <QFontMetricsF>
 #include <QPainter>
 
 #include <algorithm>
@@ -15,18 +16,14 @@ const double kTextWidth = (CDocumentPages::SizePx().width() - 2.0 * kSide) * kPx
 const double kTextHeight = (CDocumentPages::SizePx().height() - kTop - kBottom) * kPx;
 constexpr double kContentsPx = 11.0;
 
-QString Q(const std::string& text)
-{
-    return QString::fromStdString(text);
-}
-
 /// Height of a piece with those that must stay with it.
 double HeightOfGroup(const std::vector<T_FLOW_PIECE>& flow, std::size_t i)
 {
-    double height = flow[i].height;
+    const auto least = [](const T_FLOW_PIECE& p) { return p.least > 0.0 ? p.least : p.height; };
+    double height = least(flow[i]);
     while (flow[i].keepWithNext && i + 1 < flow.size()) {
         ++i;
-        height += flow[i].above + flow[i].height;
+        height += flow[i].above + least(flow[i]);
     }
     return height;
 }
@@ -36,7 +33,7 @@ T_FLOW_PIECE ContentsLine(const T_PAGE_MARK& mark, std::size_t number)
     const double indent = 18.0 * kPx * (mark.level - 1);
     const QFont font = PageFont(kContentsPx, mark.level == 1);
     const double pageWidth = 40.0 * kPx;
-    const T_PAGE_TEXT title{Q(mark.title), font, kTextWidth - indent - pageWidth};
+    const T_PAGE_TEXT title{mark.title, font, kTextWidth - indent - pageWidth};
     const T_PAGE_TEXT page{QString::number(number), font, pageWidth, Qt::AlignRight};
     T_FLOW_PIECE piece{(mark.level == 1 ? 6.0 : 2.0) * kPx, HeightOf(title)};
     piece.draw = [=](QPainter& painter, QPointF at) {
@@ -50,7 +47,8 @@ T_FLOW_PIECE ContentsLine(const T_PAGE_MARK& mark, std::size_t number)
 } // namespace
 
 CDocumentPages::CDocumentPages(const T_DOCUMENT& document, const DOC_DRAW_FN& drawing)
-    : m_title(document.title), m_program(document.program), m_pageText(document.page)
+    : m_title(PageString(document.title)), m_program(PageString(document.program)),
+      m_pageText(PageString(document.words.page))
 {
     Compose(FlowOf(document, drawing, kTextWidth, kTextHeight));
     AddContents(document);
@@ -76,6 +74,8 @@ void CDocumentPages::Compose(std::vector<T_FLOW_PIECE> flow)
             }
         }
         if (y > 0.0) y += flow[i].above;
+        if (flow[i].shrunk && y + flow[i].height > kTextHeight)
+            flow[i] = flow[i].shrunk(kTextHeight - y);
         const double height = flow[i].height;
         if (flow[i].level > 0)
             m_marks.push_back({flow[i].level, flow[i].title, m_pages.size() - 1, kTop + y / kPx});
@@ -88,7 +88,7 @@ void CDocumentPages::Compose(std::vector<T_FLOW_PIECE> flow)
 void CDocumentPages::AddContents(const T_DOCUMENT& document)
 {
     constexpr double kHeadPx = 14.0;
-    const T_PAGE_TEXT head{Q(document.contents), PageFont(kHeadPx, true), kTextWidth};
+    const T_PAGE_TEXT head{PageString(document.contents), PageFont(kHeadPx, true), kTextWidth};
     std::vector<T_FLOW_PIECE> lines;
     T_FLOW_PIECE title{24.0 * kPx, HeightOf(head) + 4.0 * kPx, true};
     title.draw = [head](QPainter& painter, QPointF at) {
@@ -141,11 +141,12 @@ void CDocumentPages::DrawFrame(QPainter& painter, std::size_t page) const
     const QFont font = PageFont(kSmallPx);
     const double top = 36.0 * kPx, bottom = height - 42.0 * kPx;
     const double half = 0.5 * kTextWidth;
-    QString number = Q(m_pageText);
+    QString number = m_pageText;
     number.replace(QStringLiteral("{1}"), QString::number(page + 1));
     number.replace(QStringLiteral("{2}"), QString::number(Count()));
-    DrawText(painter, {left, top}, {Q(m_title), font, half});
-    DrawText(painter, {left + half, top}, {Q(m_program), font, half, Qt::AlignRight});
+    const QString title = QFontMetricsF(font).elidedText(m_title, Qt::ElideRight, half);
+    DrawText(painter, {left, top}, {title, font, half});
+    DrawText(painter, {left + half, top}, {m_program, font, half, Qt::AlignRight});
     DrawText(painter, {left, bottom}, {number, font, kTextWidth, Qt::AlignRight});
     painter.setPen(QPen(soft, 0.5 * kPx));
     painter.drawLine(QPointF(left, top + 16.0 * kPx), QPointF(width - left, top + 16.0 * kPx));

@@ -8,7 +8,7 @@
 /// A chapter and where it stands.
 struct T_PAGE_MARK {
     int level = 1; // from 1
-    std::string title;
+    QString title;
     std::size_t page = 0; // index
     double y = 0.0;       // px at 96 dpi from the top of the page
 };
@@ -37,5 +37,5 @@ private:
 
     std::vector<T_PAGE> m_pages;
     std::vector<T_PAGE_MARK> m_marks;
-    std::string m_title, m_program, m_pageText;
+    QString m_title, m_program, m_pageText;
 };

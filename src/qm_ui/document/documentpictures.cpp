@@ -1,13 +1,17 @@
 #include "qm_ui/document/documentpictures.h"
 
+#include "qm_base/textformat.h"
+#include "qm_ui/factors/ulfplot.h"
 #include "qm_ui/frame/framepainter.h"
 #include "qm_ui/hinge/hingeplot.h"
 #include "qm_ui/plot/plotdrawing.h"
 #include "qm_ui/push/judgedrawing.h"
 #include "qm_ui/push/pushcurveplot.h"
+#include "qm_ui/pushover/comparisonplot.h"
 #include "qm_ui/pushover/evaluationplot.h"
 #include "qm_ui/section/sectionbarsplot.h"
 
+#include <algorithm>
 #include <memory>
 
 namespace {
@@ -21,6 +25,34 @@ T_DRAWING Kept(T_PLOT plot)
         draw(painter, rect);
     };
     return drawing;
+}
+
+/// One line of a thick pen for each bar; its value stands at its end.
+T_PLOT BarsPlot(const T_BARS_VIEW& view)
+{
+    constexpr double kThick = 12.0; // px
+    constexpr T_PLOT_COLOR kColor{31, 78, 140};
+    T_PLOT plot;
+    plot.title = view.title;
+    plot.x.title = view.axis;
+    const auto count = static_cast<double>(view.bars.size());
+    double largest = 0.0;
+    for (std::size_t i = 0; i < view.bars.size(); ++i) {
+        const auto& [name, value] = view.bars[i];
+        const double y = count - static_cast<double>(i);
+        T_PLOT_SERIES& bar = plot.series.emplace_back();
+        bar.x = {0.0, value};
+        bar.y = {y, y};
+        bar.line = PLOT_LINE::Solid;
+        bar.width = kThick;
+        bar.color = kColor;
+        bar.marker = PLOT_MARKER::None;
+        plot.y.labels.push_back({y, name, FormatText("%.4g", value)});
+        largest = std::max(largest, value);
+    }
+    plot.y.range = T_PLOT_RANGE{0.4, count + 0.6};
+    if (largest > 0.0) plot.x.range = T_PLOT_RANGE{0.0, 1.05 * largest};
+    return plot;
 }
 
 struct T_DRAWN {
@@ -70,11 +102,33 @@ struct T_DRAWN {
         };
         return drawing;
     }
+    T_DRAWING operator()(const T_COMPARISON_VIEW& view) const
+    {
+        T_PLOT plot = ComparisonPlot(*view.comparison);
+        plot.title = picture.caption; // these are not all methods that there are
+        return Kept(std::move(plot));
+    }
+    T_DRAWING operator()(const T_BARS_VIEW& view) const
+    {
+        T_DRAWING drawing = Kept(BarsPlot(view));
+        constexpr double kRow = 26.0, kRest = 110.0; // px: a bar; title and axis
+        drawing.size.setHeight(kRest + kRow * static_cast<double>(view.bars.size()));
+        return drawing;
+    }
+    T_DRAWING operator()(const T_FACTORS_VIEW& view) const
+    {
+        T_ULF_PICTURE bars = UlfPictureOf({doc, *view.result});
+        bars.notes.clear(); // the factors stand in a table of their own
+        return Kept(UlfPlot(bars));
+    }
 };
 
 } // namespace
 
 T_DRAWING DrawingOf(CDBDoc& doc, const T_DOC_PICTURE& picture)
 {
-    return std::visit(T_DRAWN{doc, picture}, picture.view);
+    T_DRAWING drawing = std::visit(T_DRAWN{doc, picture}, picture.view);
+    // A narrow picture is drawn smaller, not shrunk: its texts are as large as those of a wide one.
+    drawing.size *= picture.width;
+    return drawing;
 }

@@ -11,13 +11,8 @@
 namespace {
 
 constexpr double kPx = kPageUnitsPerPx;
-constexpr double kBodyPx = 11.0, kMonoPx = 8.5, kSmallestMonoPx = 5.5;
+constexpr double kBodyPx = 11.0;
 constexpr std::array<double, 3> kHeadingPx{18.0, 14.0, 12.0};
-
-QString Q(const std::string& text)
-{
-    return QString::fromStdString(text);
-}
 
 T_FLOW_PIECE TextPiece(T_PAGE_TEXT text, double above, QColor color = Qt::black)
 {
@@ -29,10 +24,56 @@ T_FLOW_PIECE TextPiece(T_PAGE_TEXT text, double above, QColor color = Qt::black)
     return piece;
 }
 
+/// A picture with its caption.
+struct T_FIGURE {
+    std::shared_ptr<const T_DRAWING> drawing;
+    T_PAGE_TEXT caption;
+    double x = 0.0, scale = 1.0;
+
+    double Height() const { return scale * drawing->size.height(); }
+};
+
+void DrawFigure(QPainter& painter, QPointF at, const T_FIGURE& figure, double captionAt)
+{
+    const QRectF rect({0.0, 0.0}, figure.drawing->size);
+    painter.save();
+    painter.translate(at + QPointF(figure.x, 0.0));
+    painter.scale(figure.scale, figure.scale);
+    painter.setClipRect(rect);
+    figure.drawing->draw(painter, rect);
+    painter.restore();
+    painter.setPen(QColor(90, 98, 110));
+    DrawText(painter, at + QPointF(figure.x, captionAt), figure.caption);
+}
+
+/// Pictures beside each other, their captions on one line below them.
+T_FLOW_PIECE FiguresPiece(std::vector<T_FIGURE> figures)
+{
+    constexpr double kAbove = 8.0 * kPx, kGap = 2.0 * kPx, kLeast = 0.8;
+    double pictures = 0.0, captions = 0.0;
+    for (const T_FIGURE& figure : figures) {
+        pictures = std::max(pictures, figure.Height());
+        captions = std::max(captions, kGap + HeightOf(figure.caption));
+    }
+    T_FLOW_PIECE piece{kAbove, pictures + captions};
+    piece.draw = [figures, at = pictures + kGap](QPainter& painter, QPointF corner) {
+        for (const T_FIGURE& figure : figures)
+            DrawFigure(painter, corner, figure, at);
+    };
+    piece.least = kLeast * pictures + captions;
+    piece.shrunk = [figures, pictures, captions](double height) {
+        std::vector<T_FIGURE> smaller = figures;
+        for (T_FIGURE& figure : smaller)
+            figure.scale *= (height - captions) / pictures;
+        return FiguresPiece(std::move(smaller));
+    };
+    return piece;
+}
+
 class CFlowWriter {
 public:
-    CFlowWriter(const DOC_DRAW_FN& drawing, double width, double height)
-        : m_drawing(drawing), m_width(width), m_height(height)
+    CFlowWriter(const T_DOC_WORDS& words, const DOC_DRAW_FN& drawing, double width, double height)
+        : m_words(words), m_drawing(drawing), m_width(width), m_height(height)
     {
     }
 
@@ -42,36 +83,38 @@ public:
                                        QColor(125, 80, 0)};
         constexpr std::array signs{"", "\u2713 ", "\u2717 ", "! "};
         const auto tone = static_cast<std::size_t>(t.tone);
-        if (t.mono) return Mono(t.text);
         constexpr double kAbove = 6.0 * kPx;
-        m_out.push_back(
-            TextPiece({QString::fromUtf8(signs[tone]) + Q(t.text), PageFont(kBodyPx), m_width},
-                      kAbove, colors[tone]));
+        EndFigures();
+        m_out.push_back(TextPiece(
+            Fit({QString::fromUtf8(signs[tone]) + PageString(t.text), PageFont(kBodyPx), m_width}),
+            kAbove, colors[tone]));
     }
-    void operator()(const T_DOC_TABLE& t) { AddTable(t, m_width, m_out); }
-    void operator()(const T_DOC_FACTS& t) { AddFacts(t, m_width, m_out); }
+    void operator()(const T_DOC_TABLE& t)
+    {
+        EndFigures();
+        AddTable(t, m_words, m_width, m_out);
+    }
+    void operator()(const T_DOC_FACTS& t)
+    {
+        EndFigures();
+        AddFacts(t, m_words, m_width, m_out);
+    }
+    /// Narrow ones wait for the next one, to stand beside it.
     void operator()(const T_DOC_PICTURE& p)
     {
         if (!m_drawing) return;
-        const auto drawing = std::make_shared<const T_DRAWING>(m_drawing(p));
-        const QSizeF size = drawing->size;
-        constexpr double kHighest = 0.55; // of the page
-        const double scale =
-            std::min(p.width * m_width / size.width(), kHighest * m_height / size.height());
-        constexpr double kAbove = 8.0 * kPx;
-        T_FLOW_PIECE piece{kAbove, scale * size.height(), true};
-        piece.draw = [drawing, scale, size](QPainter& painter, QPointF at) {
-            painter.save();
-            painter.translate(at);
-            painter.scale(scale, scale);
-            painter.setClipRect(QRectF({0, 0}, size));
-            drawing->draw(painter, QRectF({0, 0}, size));
-            painter.restore();
-        };
-        m_out.push_back(std::move(piece));
-        constexpr double kCaptionPx = 9.0;
-        m_out.push_back(TextPiece({Q(p.caption), PageFont(kCaptionPx), m_width}, 2.0 * kPx,
-                                  QColor(90, 98, 110)));
+        const bool narrow = p.width <= kHalfPage;
+        if (!narrow) EndFigures();
+        constexpr double kHighest = 0.55, kCaptionPx = 9.0; // of the page
+        T_FIGURE figure;
+        figure.drawing = std::make_shared<const T_DRAWING>(m_drawing(p));
+        const QSizeF size = figure.drawing->size;
+        const double width = p.width * m_width;
+        figure.scale = std::min(width / size.width(), kHighest * m_height / size.height());
+        figure.x = m_figures.empty() ? 0.0 : m_width - width;
+        figure.caption = Fit({PageString(p.caption), PageFont(kCaptionPx), width});
+        m_figures.push_back(std::move(figure));
+        if (!narrow || m_figures.size() == 2) EndFigures();
     }
 
     void Chapter(const T_DOC_CHAPTER& chapter, std::vector<std::size_t> place)
@@ -79,16 +122,18 @@ public:
         const std::string number = ChapterNumber(place);
         const std::size_t level = std::min(place.size(), kHeadingPx.size());
         constexpr double kAbove = 16.0 * kPx;
-        T_FLOW_PIECE piece = TextPiece(
-            {Q(number + " " + chapter.title), PageFont(kHeadingPx[level - 1], true), m_width},
-            kAbove, QColor(31, 78, 140));
+        const QString title = Shortened(PageString(number + " " + chapter.title), kLongestTitle);
+        EndFigures();
+        T_FLOW_PIECE piece = TextPiece({title, PageFont(kHeadingPx[level - 1], true), m_width},
+                                       kAbove, QColor(31, 78, 140));
         piece.keepWithNext = true;
         piece.opensChapter = level == 1;
         piece.level = static_cast<int>(level);
-        piece.title = number + " " + chapter.title;
+        piece.title = title;
         m_out.push_back(std::move(piece));
         for (const T_DOC_BLOCK& block : chapter.blocks)
             std::visit(*this, block);
+        EndFigures();
         place.push_back(0);
         for (const T_DOC_CHAPTER& part : chapter.parts) {
             ++place.back();
@@ -99,31 +144,34 @@ public:
     void TitleBlock(const T_DOCUMENT& d)
     {
         constexpr double kTitlePx = 24.0, kSubtitlePx = 13.0;
-        m_out.push_back(TextPiece({Q(d.title), PageFont(kTitlePx, true), m_width}, 0.0));
+        m_out.push_back(TextPiece(
+            {Shortened(PageString(d.title), kLongestTitle), PageFont(kTitlePx, true), m_width},
+            0.0));
         if (!d.subtitle.empty())
-            m_out.push_back(TextPiece({Q(d.subtitle), PageFont(kSubtitlePx), m_width}, 4.0 * kPx,
-                                      QColor(90, 98, 110)));
+            m_out.push_back(TextPiece({PageString(d.subtitle), PageFont(kSubtitlePx), m_width},
+                                      4.0 * kPx, QColor(90, 98, 110)));
         T_FLOW_PIECE gap{12.0 * kPx, 0.0, true};
         gap.draw = [](QPainter&, QPointF) {};
         m_out.push_back(std::move(gap));
-        AddPairs(d.head, m_width, 0.0, m_out);
+        AddPairs(d.head, m_words, m_width, 0.0, m_out);
     }
 
     void SignOff(const T_DOCUMENT& d)
     {
         constexpr double kRow = 42.0 * kPx, kHeading = 14.0;
-        T_FLOW_PIECE head = TextPiece({Q(d.signOffTitle), PageFont(kHeading, true), m_width},
-                                      24.0 * kPx, QColor(31, 78, 140));
+        T_FLOW_PIECE head =
+            TextPiece({PageString(d.signOffTitle), PageFont(kHeading, true), m_width}, 24.0 * kPx,
+                      QColor(31, 78, 140));
         head.keepWithNext = true;
         head.level = 1;
         head.onNewPage = d.chapters.empty(); // the first page is that of the title block
-        head.title = d.signOffTitle;
+        head.title = PageString(d.signOffTitle);
         m_out.push_back(std::move(head));
         std::vector<T_DOC_HEAD_ROW> rows;
         for (const std::string& who : d.signOff)
             rows.push_back({who, {}});
         const std::size_t first = m_out.size();
-        AddPairs(rows, m_width, kRow, m_out);
+        AddPairs(rows, m_words, m_width, kRow, m_out);
         for (std::size_t i = first; i + 1 < m_out.size(); ++i)
             m_out[i].keepWithNext = true;
     }
@@ -131,24 +179,23 @@ public:
     std::vector<T_FLOW_PIECE> Take() { return std::move(m_out); }
 
 private:
-    /// Lines as they are, in a font in which the longest one fits.
-    void Mono(const std::string& text)
+    static constexpr int kLongestTitle = 240; // characters
+
+    void EndFigures()
     {
-        const QString all = Q(text);
-        const double natural = WidthOf(all, PageMonoFont(kMonoPx));
-        const double px =
-            std::max(kSmallestMonoPx, kMonoPx * std::min(1.0, m_width / std::max(natural, 1.0)));
-        bool first = true;
-        for (const QString& line : all.split(QLatin1Char('\n'))) {
-            m_out.push_back(
-                TextPiece({line.isEmpty() ? QStringLiteral(" ") : line, PageMonoFont(px), m_width},
-                          first ? 6.0 * kPx : 0.0));
-            first = false;
-        }
+        if (!m_figures.empty()) m_out.push_back(FiguresPiece(std::move(m_figures)));
+        m_figures.clear();
+    }
+    T_PAGE_TEXT Fit(T_PAGE_TEXT text) const
+    {
+        constexpr double kMost = 0.9; // of the page
+        return Fitted(std::move(text), kMost * m_height, PageString(m_words.cut));
     }
 
+    const T_DOC_WORDS& m_words;
     const DOC_DRAW_FN& m_drawing;
     double m_width, m_height;
+    std::vector<T_FIGURE> m_figures; // that wait for one beside them
     std::vector<T_FLOW_PIECE> m_out;
 };
 
@@ -157,7 +204,7 @@ private:
 std::vector<T_FLOW_PIECE> FlowOf(const T_DOCUMENT& document, const DOC_DRAW_FN& drawing,
                                  double width, double height)
 {
-    CFlowWriter writer(drawing, width, height);
+    CFlowWriter writer(document.words, drawing, width, height);
     writer.TitleBlock(document);
     std::vector<std::size_t> place{0};
     for (const T_DOC_CHAPTER& chapter : document.chapters) {

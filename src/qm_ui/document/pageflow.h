@@ -5,6 +5,7 @@
 #include "qm_ui/report/picturefile.h"
 
 #include <QPointF>
+#include <QString>
 
 #include <functional>
 #include <memory>
@@ -24,7 +25,11 @@ struct T_FLOW_PIECE {
     std::shared_ptr<const T_FLOW_PIECE> head{};
     /// A chapter for contents and bookmarks: its number and title; level from 1, 0: none.
     int level = 0;
-    std::string title{};
+    QString title{};
+    /// Of a picture that may be drawn smaller where that saves a page: the least height, and the
+    /// piece of another height.
+    double least = 0.0; // 0: it stays as it is
+    std::function<T_FLOW_PIECE(double height)> shrunk{};
 };
 
 using DOC_DRAW_FN = std::function<T_DRAWING(const T_DOC_PICTURE&)>;

@@ -1,5 +1,7 @@
 #include "qm_ui/document/pagetext.h"
 
+#include "qm_rps/document/document.h"
+
 #include <QFontMetricsF>
 #include <QPainter>
 #include <QTextLayout>
@@ -14,6 +16,8 @@ namespace {
 double LayOut(QTextLayout& layout, const T_PAGE_TEXT& text)
 {
     QTextOption option(text.align);
+    // A name in a script from right to left leaves the page as it is.
+    option.setTextDirection(Qt::LeftToRight);
     option.setWrapMode(QTextOption::WrapAtWordBoundaryOrAnywhere);
     layout.setTextOption(option);
     layout.beginLayout();
@@ -50,9 +54,31 @@ QFont PageFont(double px, bool bold)
     return FontOf("DejaVu Sans", px, bold);
 }
 
-QFont PageMonoFont(double px)
+QString PageString(const std::string& text)
 {
-    return FontOf("DejaVu Sans Mono", px, false);
+    return QString::fromStdString(CleanText(text));
+}
+
+T_PAGE_TEXT Fitted(T_PAGE_TEXT text, double height, const QString& cut)
+{
+    constexpr qsizetype kSurelyFits = 200; // characters, of which few texts have more
+    if (text.text.size() <= kSurelyFits || HeightOf(text) <= height) return text;
+    const QString whole = text.text;
+    QString rest = QLatin1Char(' ') + cut;
+    rest.replace(QStringLiteral("{1}"), QString::number(whole.size()));
+    qsizetype fits = 0, tooMany = whole.size();
+    while (tooMany - fits > 1) {
+        const qsizetype tried = (fits + tooMany) / 2;
+        text.text = whole.left(tried) + rest;
+        (HeightOf(text) <= height ? fits : tooMany) = tried;
+    }
+    text.text = whole.left(fits) + rest;
+    return text;
+}
+
+QString Shortened(const QString& text, int most)
+{
+    return text.size() <= most ? text : text.left(most - 3) + QStringLiteral("...");
 }
 
 double HeightOf(const T_PAGE_TEXT& text)

@@ -66,7 +66,7 @@ private:
         where.appendItem(QPDFObjectHandle::newReal(top, 1));
         where.appendItem(QPDFObjectHandle::newNull());
         QPDFObjectHandle item = m_pdf.makeIndirectObject(QPDFObjectHandle::newDictionary());
-        item.replaceKey("/Title", QPDFObjectHandle::newUnicodeString(mark.title));
+        item.replaceKey("/Title", QPDFObjectHandle::newUnicodeString(mark.title.toStdString()));
         item.replaceKey("/Parent", parent);
         item.replaceKey("/Dest", where);
         return item;
