@@ -16,11 +16,14 @@ void AddModelReport(CLI::App& app, EXIT_CODE& code)
     sub->add_option("--html", o->html, Say("IDS_QM_HELP_REPORT_HTML"));
     sub->add_option("--pdf", o->pdf, Say("IDS_QM_HELP_REPORT_PDF"));
     sub->add_option("--only", o->only, Say("IDS_QM_HELP_REPORT_ONLY"));
-    sub->add_option("--rows", o->rows, Say("IDS_QM_HELP_REPORT_ROWS"))->capture_default_str();
-    sub->add_option("--project", o->head.project, Say("IDS_QM_HELP_REPORT_PROJECT"));
-    sub->add_option("--author", o->head.author, Say("IDS_QM_HELP_REPORT_AUTHOR"));
-    sub->add_option("--checker", o->head.checker, Say("IDS_QM_HELP_REPORT_CHECKER"));
-    sub->add_option("--date", o->head.date, Say("IDS_QM_HELP_REPORT_DATE"));
+    sub->add_option("--rows", o->rows, Say("IDS_QM_HELP_REPORT_ROWS"))
+        ->check(CLI::Range(0, 1000000));
+    sub->add_option("--project", o->project, Say("IDS_QM_HELP_REPORT_PROJECT"));
+    sub->add_option("--author", o->author, Say("IDS_QM_HELP_REPORT_AUTHOR"));
+    sub->add_option("--checker", o->checker, Say("IDS_QM_HELP_REPORT_CHECKER"));
+    sub->add_option("--date", o->date, Say("IDS_QM_HELP_REPORT_DATE"));
+    sub->add_flag("--keep", o->keep, Say("IDS_QM_HELP_REPORT_KEEP"));
+    sub->add_option("-o", o->out, Say("IDS_QM_HELP_REPORT_OUT"));
     AddOverwrite(sub, o->overwrite);
     AddExample(sub, "report examples/rc-frame-3-storey/case.json --html report.html --pdf "
                     "report.pdf --author \"A. Engineer\" --date 2026-11-23");

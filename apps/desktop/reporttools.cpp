@@ -45,6 +45,7 @@ T_COMMAND ReportCommand(T_DESKTOP& desktop)
         CReportDlg dialog(desktop.doc);
         Prepare(desktop, dialog);
         (void)dialog.DoModal();
+        desktop.changed(); // the settings of the report may be others
     };
     return {"IDS_QM_UI_MENU_FILE", "IDS_QM_UI_REPORT_COMMAND", "Ctrl+R", open};
 }

@@ -1,6 +1,7 @@
 #include "qm_rps/reportdlg.h"
 
 #include "qm_base/say.h"
+#include "qm_db/editscope.h"
 
 #include <algorithm>
 #include <filesystem>
@@ -8,6 +9,35 @@
 std::string CReportDlg::ChapterText(std::size_t chapter)
 {
     return Say(ChapterKey(static_cast<REPORT_CHAPTER>(chapter)));
+}
+
+CReportDlg::CReportDlg(CDBDoc& doc) : m_head(doc.Data().Model().styp.report), m_doc(doc)
+{
+    m_rows = m_head.rows;
+    for (std::size_t i = 0; i < m_chosen.size(); ++i)
+        m_chosen[i] = m_head.chapters.empty() ||
+                      std::ranges::count(m_head.chapters, kReportChapterNames[i]) > 0;
+}
+
+T_REPORT_D CReportDlg::Settings() const
+{
+    T_REPORT_D settings = m_head;
+    settings.rows = m_rows;
+    settings.chapters.clear();
+    if (std::ranges::count(m_chosen, false) == 0) return settings; // all: no list of them
+    for (std::size_t i = 0; i < m_chosen.size(); ++i)
+        if (m_chosen[i]) settings.chapters.emplace_back(kReportChapterNames[i]);
+    return settings;
+}
+
+int CReportDlg::Keep()
+{
+    T_STYP_D styp = m_doc.Data().Model().styp;
+    const T_REPORT_D settings = Settings();
+    if (styp.report == settings) return 1;
+    styp.report = settings;
+    CEditScope edit(m_doc, Say("IDS_QM_REPORT_SETTINGS"));
+    return edit.PutStyp(std::move(styp)) && edit.Commit();
 }
 
 T_REPORT_OPTIONS CReportDlg::Options() const
@@ -32,6 +62,10 @@ int CReportDlg::OnMake()
 {
     if (std::ranges::count(m_chosen, true) == 0 || m_rows < 0) {
         ShowMessage(m_rows < 0 ? "IDS_QM_UI_REPORT_ROWS_REFUSED" : "IDS_QM_UI_REPORT_NO_CHAPTER");
+        return 0;
+    }
+    if (!Keep()) {
+        ShowMessage("IDS_QM_UI_REPORT_NOT_KEPT");
         return 0;
     }
     const auto make = [this](const TELL_FN& tell) {

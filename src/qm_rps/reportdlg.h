@@ -1,4 +1,5 @@
-// Model of the window of the report: title block, chapters, preview, files.
+// Model of the window of the report: title block, chapters, preview, files. It opens with the
+// settings that the model keeps, and keeps them there when a report is made.
 #pragma once
 
 #include "qm_base/mdialog.h"
@@ -7,9 +8,9 @@
 class CReportDlg : public zql::frx::MDialog {
 public:
     /// The document must outlive the dialog.
-    explicit CReportDlg(CDBDoc& doc) : m_doc(doc) { m_chosen.fill(true); }
+    explicit CReportDlg(CDBDoc& doc);
 
-    T_REPORT_D m_head; // its chapters are m_chosen
+    T_REPORT_D m_head; // its chapters and rows are those below
     std::array<bool, kReportChapterNames.size()> m_chosen{};
     int m_rows = 200; // of a table at most; 0: all
     std::string m_fileHash;
@@ -24,8 +25,10 @@ public:
     /// Writes the document as a page or as a PDF; set by the view. 1 done; 0 error says why not.
     std::function<int(bool pdf, const std::string& path, std::string& error)> m_write;
 
-    /// Makes the document of the present settings. 1 made; 0 cancelled, or with a message: no
-    /// chapter is chosen, or the number of rows is negative. What was made before stays.
+    /// Keeps the present settings in the model, as one step that can be undone, and makes the
+    /// document of them. 1 made; 0 cancelled, or with a message: no chapter is chosen, the number
+    /// of rows is negative (nothing is kept then), or the model can't be changed now. What was made
+    /// before stays.
     int OnMake();
     /// Writes a file of the present settings. 1 written; 0 cancelled, or with a message.
     int OnWrite(bool pdf);
@@ -40,6 +43,8 @@ public:
 
 private:
     T_REPORT_OPTIONS Options() const;
+    T_REPORT_D Settings() const;
+    [[nodiscard]] int Keep();
     bool IsCurrent() const;
 
     CDBDoc& m_doc;

@@ -66,6 +66,12 @@ void CPagesView::paintEvent(QPaintEvent*)
     QPainter painter(viewport());
     painter.fillRect(viewport()->rect(), palette().color(QPalette::Mid));
     painter.setRenderHint(QPainter::Antialiasing);
+    if (Count() == 0) {
+        constexpr int kSide = 40; // of the text, px
+        painter.setPen(palette().color(QPalette::WindowText));
+        painter.drawText(viewport()->rect().adjusted(kSide, kSide, -kSide, -kSide),
+                         Qt::AlignCenter | Qt::TextWordWrap, m_hint);
+    }
     const double scale = Scale();
     for (std::size_t page = 0; page < Count(); ++page) {
         const double top =

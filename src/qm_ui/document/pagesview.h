@@ -14,6 +14,7 @@ public:
     explicit CPagesView(QWidget* parent = nullptr);
     /// Null: nothing is shown.
     void SetPages(std::shared_ptr<const CDocumentPages> pages);
+    QString m_hint; // stands in the place of pages while there are none
     std::size_t Count() const { return m_pages ? m_pages->Count() : 0; }
 
 protected:

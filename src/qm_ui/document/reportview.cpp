@@ -1,5 +1,6 @@
 #include "qm_ui/document/reportview.h"
 
+#include "qm_base/say.h"
 #include "qm_rps/reportdlg.h"
 #include "qm_ui/document/documentfile.h"
 #include "qm_ui/document/documentpictures.h"
@@ -18,6 +19,7 @@ public:
     }
     void Show() override
     {
+        m_view->m_hint = QString::fromStdString(Say("IDS_QM_UI_REPORT_HINT"));
         if (!m_dlg.IsMade() || m_made == m_dlg.Times()) return;
         m_made = m_dlg.Times();
         m_view->SetPages(std::make_shared<const CDocumentPages>(
