@@ -54,6 +54,9 @@ struct T_SHEET {
     std::string name = "Sheet1"; // up to 31 letters, none of []:*?/\ .
     std::map<SHEET_AT, T_SHEET_CELL> cells{};
     std::vector<T_SHEET_WIDTH> widths{};
+    /// Rows from the top and columns from the left that stay in sight; the rows head every page.
+    std::size_t frozenRows = 0, frozenColumns = 0;
+    bool fitsWidth = false; // printed one page wide, across
     bool operator==(const T_SHEET&) const = default;
 };
 

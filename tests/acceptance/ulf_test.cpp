@@ -92,6 +92,9 @@ TEST_F(Ulf, TheSheetLivesInAnOfficeProgram)
     ASSERT_LE(21U, cells.size());
     EXPECT_EQ("Date : 2026/3/7", cells[3][3]);
     EXPECT_EQ("T101", cells[13][0]);
+    EXPECT_EQ("Quantity", cells[5][1]);
+    EXPECT_EQ("m", cells[6][2]);
+    EXPECT_EQ("unknown", cells[13][10]); // beside the frame of eight constraints
     const json solved = Json("ulf solve @cable-stayed-bridge --item LEVEL"),
                results = Json("analyse @cable-stayed-bridge --case T101");
     const double factor = std::stod(cells[13][1]);

@@ -126,6 +126,32 @@ std::string ColumnsText(const T_SHEET& sheet)
     return text + "</cols>";
 }
 
+/// The pane that scrolls begins behind what is frozen.
+std::string FrozenText(const T_SHEET& sheet)
+{
+    const auto [rows, columns] = std::pair(sheet.frozenRows, sheet.frozenColumns);
+    if (rows == 0 && columns == 0) return {};
+    const char* const pane = columns == 0 ? "bottomLeft" : rows == 0 ? "topRight" : "bottomRight";
+    std::string split;
+    if (columns > 0) split += FormatText(" xSplit=\"%zu\"", columns);
+    if (rows > 0) split += FormatText(" ySplit=\"%zu\"", rows);
+    return "<sheetViews><sheetView workbookViewId=\"0\"><pane" + split + " topLeftCell=\"" +
+           SheetAddress(rows, columns) + "\" activePane=\"" + pane +
+           "\" state=\"frozen\"/></sheetView></sheetViews>";
+}
+
+/// The frozen rows head every printed page.
+std::string PrintTitles(const T_SHEET& sheet)
+{
+    if (sheet.frozenRows == 0) return {};
+    std::string name = "'";
+    for (const char c : sheet.name)
+        name += c == '\'' ? std::string("''") : std::string(1, c);
+    return "<definedNames><definedName name=\"_xlnm.Print_Titles\" localSheetId=\"0\">" +
+           Escaped(name) + FormatText("'!$1:$%zu", sheet.frozenRows) +
+           "</definedName></definedNames>";
+}
+
 std::string EdgeText(const std::string& side, SHEET_EDGE edge)
 {
     if (edge == SHEET_EDGE::None) return '<' + side + "/>";
@@ -168,9 +194,11 @@ SHEET_FORMATS SheetFormats(const T_SHEET& sheet)
 
 std::string WorksheetPart(const T_SHEET& sheet, const SHEET_FORMATS& formats)
 {
-    std::string text = kHead + FormatText("<worksheet xmlns=\"%s\">", kMain) +
-                       "<sheetFormatPr defaultRowHeight=\"15\"/>" + ColumnsText(sheet) +
-                       "<sheetData>";
+    std::string text =
+        kHead + FormatText("<worksheet xmlns=\"%s\">", kMain) +
+        (sheet.fitsWidth ? "<sheetPr><pageSetUpPr fitToPage=\"1\"/></sheetPr>" : "") +
+        FrozenText(sheet) + "<sheetFormatPr defaultRowHeight=\"15\"/>" + ColumnsText(sheet) +
+        "<sheetData>";
     for (auto it = sheet.cells.begin(); it != sheet.cells.end();) {
         const std::size_t row = it->first.first;
         text += "<row r=\"" + std::to_string(row + 1) + "\">";
@@ -178,7 +206,10 @@ std::string WorksheetPart(const T_SHEET& sheet, const SHEET_FORMATS& formats)
             text += CellText(it->first, it->second.value, formats.at(it->second.style));
         text += "</row>";
     }
-    return text + "</sheetData></worksheet>";
+    text += "</sheetData>";
+    if (sheet.fitsWidth)
+        text += "<pageSetup orientation=\"landscape\" fitToWidth=\"1\" fitToHeight=\"0\"/>";
+    return text + "</worksheet>";
 }
 
 std::string StylesPart(const SHEET_FORMATS& formats)
@@ -219,6 +250,7 @@ std::string WorkbookPart(const T_SHEET& sheet)
            FormatText("<workbook xmlns=\"%s\" xmlns:r=\"%s\">", kMain,
                       "http://schemas.openxmlformats.org/officeDocument/2006/"
                       "relationships") +
-           "<sheets><sheet name=\"" + Escaped(sheet.name) +
-           "\" sheetId=\"1\" r:id=\"rId1\"/></sheets><calcPr fullCalcOnLoad=\"1\"/></workbook>";
+           "<bookViews><workbookView/></bookViews><sheets><sheet name=\"" + Escaped(sheet.name) +
+           "\" sheetId=\"1\" r:id=\"rId1\"/></sheets>" + PrintTitles(sheet) +
+           "<calcPr fullCalcOnLoad=\"1\"/></workbook>";
 }

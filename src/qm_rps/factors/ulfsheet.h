@@ -16,7 +16,9 @@ struct T_ULF_SHEET_SETTINGS {
 /// True when so many constraints fit.
 bool UlfSheetFits(std::size_t constraints, int applicationVersion);
 
-/// Fills the sheet; a constraint that is read at a stage and step has them in its heading. 1 done;
-/// 0 too many constraints, `sheet` as it was. Factor cells are inputs: changing one changes row 11.
+/// Fills the sheet, with quantity and unit above each constraint, whether a factor is known beside
+/// the frame, numbers rounded where they are shown; a constraint that is read at a stage and step
+/// has them in its heading. 1 done; 0 too many constraints, `sheet` as it was. Factor cells are
+/// inputs: changing one changes row 11.
 [[nodiscard]] int MakeUlfSheet(const T_ULF_RESULT& result, const T_ULF_SHEET_SETTINGS& settings,
                                T_SHEET& sheet);

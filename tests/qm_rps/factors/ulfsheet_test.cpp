@@ -79,6 +79,41 @@ TEST(UlfSheet, HoldsEveryCellInItsFrame)
     }
 }
 
+TEST(UlfSheet, NamesQuantityUnitAndWhatIsKnownAndRoundsWhatIsShown)
+{
+    T_ULF_RESULT r = Result(2, 2);
+    r.cases[0].unknown = true;
+    r.factors = {5774.5551234, 1.0};
+    r.influence = {{0.000123456789, 1e-17}, {250.0, 123456789.0}};
+    r.constraints[0].description = "DZ of node 5 <=      0.0200 >=     -0.0200";
+    r.constraints[1].description = "DZ of node 5 = node 6";
+    r.constraints[0].unit = "m";
+    T_SHEET s;
+    ASSERT_EQ(1, MakeUlfSheet(r, {}, s));
+    using V = SHEET_VALUE;
+    for (const auto& [address, value] : {std::pair{"B6", "Quantity"},
+                                         {"C6", "DZ of node 5"},
+                                         {"D6", "DZ of node 5 = node 6"},
+                                         {"C7", "m"},
+                                         {"D7", "-"},
+                                         {"E8", "Known or unknown"},
+                                         {"E12", "unknown"},
+                                         {"E13", "known"}})
+        EXPECT_EQ(V(value), At(s, address).value) << address;
+    EXPECT_EQ(V(0.000123456789), At(s, "C12").value); // stored as it is
+    // Six digits of the largest in the column: 5774.56, 0.712892 of row 11, 123...e8.
+    for (const auto& [address, format] : {std::pair{"B12", "0.00"},
+                                          {"B13", "0.00"},
+                                          {"C11", "0.000000"},
+                                          {"C13", "0.000000"},
+                                          {"D13", "0"}})
+        EXPECT_EQ(format, At(s, address).style.numberFormat) << address;
+    EXPECT_EQ("", At(s, "A12").style.numberFormat);
+    EXPECT_EQ(11U, s.frozenRows);
+    EXPECT_EQ(2U, s.frozenColumns);
+    EXPECT_TRUE(s.fitsWidth);
+}
+
 TEST(UlfSheet, AppendsTheConstantAsItIsShown)
 {
     T_ULF_RESULT r = Result(2, 2);
