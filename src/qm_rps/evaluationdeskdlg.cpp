@@ -265,6 +265,9 @@ void CEvaluationDeskDlg::UpdateFrame()
         Pushing([&](const PUSH_PROGRESS_FN& progress) {
             done = next->OnShowPoints(Shown().Result(), progress, why);
         });
+    // The frame stands where the cards do; a demand that the push has not reached is not shown.
+    const std::optional<T_EVALUATION_ANSWER> answer = AnswerOf(Shown().Result());
+    if (done && answer && !answer->state.empty()) (void)next->OnShowState(answer->state);
     m_frameBefore = std::move(m_frame);
     if (done) m_frame = std::move(next);
     m_frameNote = done ? m_frame->StepText() : why;

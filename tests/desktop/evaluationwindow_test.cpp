@@ -207,5 +207,6 @@ TEST_F(EvaluationWindow, TheFrameStandsBesideOrItIsSaidWhyNot)
     CPushOverHingeStateDlg* const frame = m_window->Model().Frame();
     ASSERT_NE(nullptr, frame) << m_window->Model().FrameNote();
     EXPECT_FALSE(frame->Marks().hinges.empty());
-    EXPECT_GE(frame->PointIndex(), 0); // at a point of the evaluation, not at a stored step
+    ASSERT_GE(frame->PointIndex(), 0); // at a point of the evaluation, not at a stored step
+    EXPECT_EQ("SLV: demand", frame->PointTexts().at(static_cast<std::size_t>(frame->PointIndex())));
 }
