@@ -1,6 +1,5 @@
 #include "mainwindow.h"
 
-#include "explorerpane.h"
 #include "newtools.h"
 #include "reporttools.h"
 #include "resultspane.h"
@@ -59,9 +58,8 @@ CMainWindow::CMainWindow()
         m_messages->appendPlainText(
             QString::fromUtf8(line.data(), static_cast<qsizetype>(line.size())));
     });
-    m_explorer->m_open = [this](EXPLORER_TABLE table, int key) {
-        OpenRecord(m_desktop, table, key);
-        Refresh();
+    m_browser->m_showResult = [this](const T_SHAPE_SOURCE& source) {
+        (void)m_framePane->Show(source, source.steps);
     };
     ShowTexts();
     Refresh();
@@ -79,7 +77,9 @@ CMainWindow::~CMainWindow()
 {
     SetMessageHistorySink({});
     m_shell.reset();
-    delete m_results; // these watch the selection, which goes before the window's children
+    // These watch the selection, which ends before the widgets of the window do.
+    m_browser.reset();
+    delete m_results;
     delete takeCentralWidget();
 }
 
@@ -89,8 +89,7 @@ void CMainWindow::MakePanes()
 {
     m_framePane = new CFramePane(m_doc, m_scene, m_selection, this);
     setCentralWidget(m_framePane);
-    m_explorer = new CExplorerPane(
-        m_doc, m_view, [this] { Refresh(); }, this);
+    m_browser = std::make_unique<CBrowser>(m_desktop, m_scene);
     m_messages = new QPlainTextEdit(this);
     m_messages->setReadOnly(true);
     m_messages->setMaximumBlockCount(1000);
@@ -101,13 +100,20 @@ void CMainWindow::MakePanes()
         addDockWidget(area, widget);
         return widget;
     };
-    QDockWidget* left = dock(m_explorer, "IDS_QM_UI_EXPLORER", Qt::LeftDockWidgetArea);
-    QDockWidget* below = dock(m_messages, "IDS_QM_UI_MESSAGES", Qt::BottomDockWidgetArea);
+    QDockWidget* left = dock(&m_browser->Tree(), "IDS_QM_UI_EXPLORER", Qt::LeftDockWidgetArea);
+    QDockWidget* right =
+        dock(&m_browser->Properties(), "IDS_QM_UI_PROPERTIES", Qt::RightDockWidgetArea);
+    QDockWidget* below = dock(&m_browser->Table(), "IDS_QM_UI_TABLES", Qt::BottomDockWidgetArea);
+    QDockWidget* told = dock(m_messages, "IDS_QM_UI_MESSAGES", Qt::BottomDockWidgetArea);
     m_results = new CResultsPane(*m_framePane, this);
-    dock(m_results, "IDS_QM_VIEW_RESULTS", Qt::BottomDockWidgetArea)->hide();
+    QDockWidget* results = dock(m_results, "IDS_QM_VIEW_RESULTS", Qt::BottomDockWidgetArea);
+    tabifyDockWidget(below, results);
+    tabifyDockWidget(results, told);
+    below->raise();
     setCorner(Qt::BottomLeftCorner, Qt::LeftDockWidgetArea);
-    resizeDocks({left}, {430}, Qt::Horizontal);
-    resizeDocks({below}, {110}, Qt::Vertical);
+    setCorner(Qt::BottomRightCorner, Qt::RightDockWidgetArea);
+    resizeDocks({left, right}, {250, 330}, Qt::Horizontal);
+    resizeDocks({below}, {230}, Qt::Vertical);
     m_units = new QLabel(this);
     statusBar()->addPermanentWidget(m_units);
 }
@@ -173,7 +179,7 @@ void CMainWindow::ShowTexts()
     if (m_recent) m_recent->setTitle(Text("IDS_QM_UI_RECENT"));
     for (QDockWidget* dock : findChildren<QDockWidget*>())
         dock->setWindowTitle(Text(dock->objectName().toLatin1().constData()));
-    m_explorer->Retranslate();
+    m_browser->Retranslate();
     m_framePane->Retranslate();
     if (m_shell) m_shell->Retranslate();
     m_results->Retranslate();
@@ -191,7 +197,7 @@ void CMainWindow::UpdateActions()
 void CMainWindow::Refresh()
 {
     m_selection.KeepExisting(m_doc);
-    m_explorer->Refresh();
+    m_browser->Refresh();
     m_framePane->Refresh();
     const T_UNITS units = m_doc.Unit().Units();
     const auto force = QString::fromStdString(std::string(NameOf(units.force)));
@@ -263,8 +269,8 @@ T_COMMANDS CMainWindow::EditCommands()
     return {{kMenu, "IDS_QM_UI_UNDO", "Ctrl+Z", undo, [this] { return m_doc.Undo().CanUndo(); }},
             {kMenu, "IDS_QM_UI_REDO", "Ctrl+Y", redo, [this] { return m_doc.Undo().CanRedo(); }},
             {kMenu},
-            {kMenu, "IDS_QM_UI_ADD_RECORD", "Ctrl+Ins", [this] { m_explorer->Add(); }},
-            {kMenu, "IDS_QM_UI_DELETE_RECORD", "Ctrl+Del", [this] { m_explorer->Delete(); }}};
+            {kMenu, "IDS_QM_UI_ADD_RECORD", "Ctrl+Ins", [this] { m_browser->Add(); }},
+            {kMenu, "IDS_QM_UI_DELETE_RECORD", "Ctrl+Del", [this] { m_browser->Delete(); }}};
 }
 
 T_COMMANDS CMainWindow::ViewCommands()
@@ -306,6 +312,8 @@ T_COMMANDS CMainWindow::ViewCommands()
             flag("IDS_QM_UI_VIEW_BEFORE", "", &O::undeformed),
             {kMenu},
             pane("IDS_QM_UI_EXPLORER"),
+            pane("IDS_QM_UI_PROPERTIES"),
+            pane("IDS_QM_UI_TABLES"),
             pane("IDS_QM_UI_MESSAGES"),
             pane("IDS_QM_VIEW_RESULTS")};
 }

@@ -1,6 +1,7 @@
-// The main window: explorer, tables, frame, messages, menus.
+// The main window: tree, properties, tables, frame, messages, menus.
 #pragma once
 
+#include "browser.h"
 #include "command.h"
 #include "desktop.h"
 #include "framepane.h"
@@ -10,7 +11,6 @@
 
 #include <memory>
 
-class CExplorerPane;
 class CResultsPane;
 class CShell;
 class QAction;
@@ -34,7 +34,8 @@ public:
 
     CDBDoc& Doc() { return m_doc; }
     CFramePane& Frame() { return *m_framePane; }
-    CExplorerPane& Explorer() { return *m_explorer; }
+    CExplorerPane& Explorer() { return m_browser->Table(); }
+    CBrowser& Browser() { return *m_browser; }
     T_DESKTOP& Desktop() { return m_desktop; }
     CShell& Shell() { return *m_shell; }
     /// The action of a command by its key, or null.
@@ -68,10 +69,10 @@ private:
     T_DESKTOP m_desktop;
     CFrameScene m_scene{m_doc};
     CSelection m_selection;
+    std::unique_ptr<CBrowser> m_browser;
 
     QElapsedTimer m_clock;
     CFramePane* m_framePane = nullptr;
-    CExplorerPane* m_explorer = nullptr;
     CResultsPane* m_results = nullptr;
     QPlainTextEdit* m_messages = nullptr;
     QLabel* m_units = nullptr;

@@ -36,9 +36,10 @@ T_COMMANDS ToolCommands(T_DESKTOP& desktop)
     return all;
 }
 
-void OpenRecord(T_DESKTOP& desktop, EXPLORER_TABLE table, int key)
+bool OpenRecord(T_DESKTOP& desktop, EXPLORER_TABLE table, int key)
 {
     for (const auto open : {OpenPushoverRecord, OpenLoadCaseRecord, OpenStructureRecord,
                             OpenHingeRecord, OpenUlfRecord, OpenNewRecord})
-        if (open(desktop, table, key)) return;
+        if (open(desktop, table, key)) return true;
+    return false;
 }

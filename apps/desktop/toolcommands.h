@@ -12,5 +12,5 @@ void RegisterViews(CViewFactory& factory);
 /// Commands of every tool, in the order of the menus. The desktop must outlive them.
 T_COMMANDS ToolCommands(T_DESKTOP& desktop);
 
-/// Opens the window of a record of a table, where it has one.
-void OpenRecord(T_DESKTOP& desktop, EXPLORER_TABLE table, int key);
+/// Opens the window of a record of a table. False: it has none.
+bool OpenRecord(T_DESKTOP& desktop, EXPLORER_TABLE table, int key);

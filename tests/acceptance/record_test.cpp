@@ -32,6 +32,9 @@ TEST_F(Record, WhatIsSetAddedAndDeletedStandsInTheFile)
     const json rows = Json("record show e.json node 22");
     EXPECT_EQ("[288, 0, 168]", rows.at(1).at("value"));
     EXPECT_EQ("xyz (in)", rows.at(1).at("head"));
+    Done("record list e.json section --csv s.csv --sheet s.xlsx");
+    EXPECT_EQ(3u, Lines(Text("s.csv")).size());
+    EXPECT_TRUE(Lines(Text("s.csv")).at(1).starts_with("1,column,"));
     EXPECT_EQ("gravity (in/s2)", Json("record show e.json model").at(4).at("head"));
 }
 

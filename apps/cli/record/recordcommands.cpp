@@ -6,6 +6,8 @@
 #include "qm_base/say.h"
 #include "qm_db/recordform.h"
 #include "qm_rps/desk/fieldhead.h"
+#include "qm_rps/desk/gridexport.h"
+#include "qm_rps/section/sectionexport.h"
 #include "json/jsontext.h"
 
 namespace {
@@ -22,6 +24,8 @@ EXIT_CODE Open(CDBDoc& doc, const T_RECORD_OPTIONS& o)
     std::vector<T_OUTPUT> outputs;
     if (!o.out.empty()) outputs.push_back({o.out, OUTPUT_KIND::Document});
     if (!o.json.empty()) outputs.push_back({o.json, OUTPUT_KIND::Json});
+    if (!o.csv.empty()) outputs.push_back({o.csv, OUTPUT_KIND::Text});
+    if (!o.sheet.empty()) outputs.push_back({o.sheet, OUTPUT_KIND::Sheet});
     if (const EXIT_CODE code = CheckOutputs(o.file, outputs, o.overwrite); code != EXIT_CODE::Done)
         return code;
     return OpenInput(doc, o.file);
@@ -150,6 +154,21 @@ std::string KindsJson(const T_MODEL& model)
     return out.Text();
 }
 
+/// The table of the kind as the window has it.
+EXIT_CODE WriteTable(CDBDoc& doc, const T_RECORD_OPTIONS& o, RECORD_KIND kind)
+{
+    const std::optional<EXPLORER_TABLE> table = TableOfKind(kind);
+    if (!table) return Refuse(o, Say("IDS_QM_CLI_RECORD_TABLE", KindWord(kind)));
+    const T_TEXT_TABLE rows = TableOfGrid(*MakeRecordGrid(doc, *table));
+    EXIT_CODE code = EXIT_CODE::Done;
+    T_FILE_ERROR error;
+    if (!o.csv.empty()) code = WriteOutput(o.csv, TableCsv(rows));
+    if (code == EXIT_CODE::Done && !o.sheet.empty() &&
+        !WriteSheet(o.sheet, TableSheet(rows), error))
+        code = ReportFileError(error);
+    return code;
+}
+
 } // namespace
 
 EXIT_CODE RunRecordList(const T_RECORD_OPTIONS& o)
@@ -160,6 +179,7 @@ EXIT_CODE RunRecordList(const T_RECORD_OPTIONS& o)
         if (const EXIT_CODE code = FindKind(o, kind); code != EXIT_CODE::Done) return code;
     if (const EXIT_CODE code = Open(doc, o); code != EXIT_CODE::Done) return code;
     const T_MODEL& model = doc.Data().Model();
+    if (!o.csv.empty() || !o.sheet.empty()) return WriteTable(doc, o, kind);
     if (!o.json.empty())
         return WriteOutput(o.json, o.kind.empty() ? KindsJson(model) : NamesJson(model, kind));
     T_TABLE_ROWS table;

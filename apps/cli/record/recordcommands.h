@@ -18,7 +18,7 @@ struct T_RECORD_OPTIONS {
     std::string out;
     bool overwrite = false;
     bool all = false; // members that are left out, too
-    std::string json;
+    std::string json, csv, sheet;
 };
 
 /// The kinds with their counts, or the records of one kind.

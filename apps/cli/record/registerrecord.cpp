@@ -29,6 +29,9 @@ void AddReading(const T_GROUP& group)
         AddOne(group, "list", Say("IDS_QM_HELP_RECORD_LIST"), " section", list, RunRecordList);
     sub->add_option("KIND", list->kind, Say("IDS_QM_HELP_RECORD_OF"));
     AddJson(sub, list->json);
+    sub->add_option("--csv", list->csv, Say("IDS_QM_HELP_RECORD_CSV"));
+    sub->add_option("--sheet", list->sheet, Say("IDS_QM_HELP_RECORD_SHEET"));
+    AddOverwrite(sub, list->overwrite);
 
     const auto show = std::make_shared<T_RECORD_OPTIONS>();
     sub = AddKindCommand(group, "show", "IDS_QM_HELP_RECORD_SHOW", " section column", show,

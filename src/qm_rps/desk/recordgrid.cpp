@@ -2,6 +2,8 @@
 
 #include "qm_rps/desk/recordtables.h"
 
+#include <algorithm>
+
 namespace {
 
 struct T_TABLE_ENTRY {
@@ -9,6 +11,7 @@ struct T_TABLE_ENTRY {
     std::size_t (*count)(const T_MODEL&);
     bool (*has)(const T_MODEL&, int key);
     std::unique_ptr<CRecordGrid> (*make)(CDBDoc&, const char* title);
+    RECORD_KIND kind;
 };
 
 template <class R>
@@ -23,24 +26,37 @@ bool Has(const T_MODEL& model, int key)
     return TableOf<R>(model).contains(key);
 }
 
+template <class R>
+constexpr T_TABLE_ENTRY Entry(const char* title,
+                              std::unique_ptr<CRecordGrid> (*make)(CDBDoc&, const char* title))
+{
+    return {title, Count<R>, Has<R>, make, KindOf<R>()};
+}
+
 // By EXPLORER_TABLE.
 constexpr T_TABLE_ENTRY kTables[] = {
-    {"IDS_QM_UI_TABLE_NODES", Count<T_NODE_D>, Has<T_NODE_D>, MakeNodeGrid},
-    {"IDS_QM_UI_TABLE_ELEMENTS", Count<T_ELEM_D>, Has<T_ELEM_D>, MakeElementGrid},
-    {"IDS_QM_UI_TABLE_SECTIONS", Count<T_SECT_D>, Has<T_SECT_D>, MakeSectionGrid},
-    {"IDS_QM_UI_TABLE_MATERIALS", Count<T_MATL_D>, Has<T_MATL_D>, MakeMaterialGrid},
-    {"IDS_QM_UI_TABLE_STOREYS", Count<T_STOR_D>, Has<T_STOR_D>, MakeStoreyGrid},
-    {"IDS_QM_UI_TABLE_LOADS", Count<T_STLD_D>, Has<T_STLD_D>, MakeLoadCaseGrid},
-    {"IDS_QM_UI_TABLE_COMBINATIONS", Count<T_LCOM_D>, Has<T_LCOM_D>, MakeCombinationGrid},
-    {"IDS_QM_UI_TABLE_STAGES", Count<T_STAG_D>, Has<T_STAG_D>, MakeStageGrid},
-    {"IDS_QM_UI_TABLE_PUSHOVERS", Count<T_POLC_D>, Has<T_POLC_D>, MakePushoverGrid},
-    {"IDS_QM_UI_TABLE_HINGE_TYPES", Count<T_PHGT_D>, Has<T_PHGT_D>, MakeHingeTypeGrid},
-    {"IDS_QM_UI_TABLE_HINGES", Count<T_PHGE_D>, Has<T_PHGE_D>, MakeHingeGrid},
-    {"IDS_QM_UI_TABLE_SPECTRA", Count<T_SPFC_D>, Has<T_SPFC_D>, MakeSpectrumGrid},
-    {"IDS_QM_UI_TABLE_EVALUATIONS", Count<T_EVAL_D>, Has<T_EVAL_D>, MakeEvaluationGrid},
-    {"IDS_QM_UI_TABLE_CONSTRAINTS", Count<T_ULFC_D>, Has<T_ULFC_D>, MakeConstraintGrid},
-    {"IDS_QM_UI_TABLE_ITEMS", Count<T_ULFI_D>, Has<T_ULFI_D>, MakeUlfItemGrid},
-    {"IDS_QM_UI_TABLE_STAGE_ITEMS", Count<T_ULSI_D>, Has<T_ULSI_D>, MakeStageItemGrid},
+    Entry<T_NODE_D>("IDS_QM_UI_TABLE_NODES", MakeNodeGrid),
+    Entry<T_ELEM_D>("IDS_QM_UI_TABLE_ELEMENTS", MakeElementGrid),
+    Entry<T_SECT_D>("IDS_QM_UI_TABLE_SECTIONS", MakeSectionGrid),
+    Entry<T_MATL_D>("IDS_QM_UI_TABLE_MATERIALS", MakeMaterialGrid),
+    Entry<T_STOR_D>("IDS_QM_UI_TABLE_STOREYS", MakeStoreyGrid),
+    Entry<T_STLD_D>("IDS_QM_UI_TABLE_LOADS", MakeLoadCaseGrid),
+    Entry<T_LCOM_D>("IDS_QM_UI_TABLE_COMBINATIONS", MakeCombinationGrid),
+    Entry<T_STAG_D>("IDS_QM_UI_TABLE_STAGES", MakeStageGrid),
+    Entry<T_POLC_D>("IDS_QM_UI_TABLE_PUSHOVERS", MakePushoverGrid),
+    Entry<T_PHGT_D>("IDS_QM_UI_TABLE_HINGE_TYPES", MakeHingeTypeGrid),
+    Entry<T_PHGE_D>("IDS_QM_UI_TABLE_HINGES", MakeHingeGrid),
+    Entry<T_SPFC_D>("IDS_QM_UI_TABLE_SPECTRA", MakeSpectrumGrid),
+    Entry<T_EVAL_D>("IDS_QM_UI_TABLE_EVALUATIONS", MakeEvaluationGrid),
+    Entry<T_ULFC_D>("IDS_QM_UI_TABLE_CONSTRAINTS", MakeConstraintGrid),
+    Entry<T_ULFI_D>("IDS_QM_UI_TABLE_ITEMS", MakeUlfItemGrid),
+    Entry<T_ULSI_D>("IDS_QM_UI_TABLE_STAGE_ITEMS", MakeStageItemGrid),
+    Entry<T_EIGV_D>("IDS_QM_UI_TABLE_MODES", MakeModeGrid),
+    Entry<T_DIAP_D>("IDS_QM_UI_TABLE_DIAPHRAGMS", MakeDiaphragmGrid),
+    Entry<T_EQDS_D>("IDS_QM_UI_TABLE_EQUAL", MakeEqualGrid),
+    Entry<T_IEHP_D>("IDS_QM_UI_TABLE_INELASTIC", MakeInelasticGrid),
+    Entry<T_POFC_D>("IDS_QM_UI_TABLE_FUNCTIONS", MakeFunctionGrid),
+    Entry<T_POVR_D>("IDS_QM_UI_TABLE_LIMIT_STEPS", MakeLimitStepGrid),
 };
 static_assert(std::size(kTables) == static_cast<std::size_t>(EXPLORER_TABLE::Count));
 
@@ -54,6 +70,18 @@ const T_TABLE_ENTRY& Entry(EXPLORER_TABLE table)
 const char* TitleKey(EXPLORER_TABLE table)
 {
     return Entry(table).title;
+}
+
+RECORD_KIND KindOfTable(EXPLORER_TABLE table)
+{
+    return Entry(table).kind;
+}
+
+std::optional<EXPLORER_TABLE> TableOfKind(RECORD_KIND kind)
+{
+    const auto it = std::ranges::find(kTables, kind, &T_TABLE_ENTRY::kind);
+    if (it == std::end(kTables)) return {};
+    return static_cast<EXPLORER_TABLE>(it - std::begin(kTables));
 }
 
 std::size_t RecordCount(const CDBDoc& doc, EXPLORER_TABLE table)

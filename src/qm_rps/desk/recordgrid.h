@@ -8,6 +8,15 @@
 
 #include <memory>
 
+/// How the rows of a table stand: by key, or by the cells of a column (numbers as numbers), and
+/// which of them: those with the text in one of their cells.
+struct T_GRID_ORDER {
+    int column = -1; // -1: by key
+    bool falling = false;
+    std::string filter{}; // in any case of letters; empty: all
+    bool operator==(const T_GRID_ORDER&) const = default;
+};
+
 /// A table of records, one row each, in the document's current units. Edits go to the document as
 /// undoable steps; rows follow it.
 class CRecordGrid : public zql::frx::MDialog {
@@ -31,10 +40,12 @@ public:
     virtual int KeyOf(std::size_t row) const = 0;
     /// Row of a record; -1: none.
     virtual long RowOf(int key) const = 0;
-    /// Whether records can be added here; other ones have their own windows.
-    virtual bool CanAdd() const = 0;
     /// Adds a record with default values under the next key. 0 with a message.
     [[nodiscard]] virtual int OnAdd() = 0;
+    /// Key of the record that was added last; 0: none.
+    virtual int MadeKey() const = 0;
+    virtual void SetOrder(const T_GRID_ORDER& order) = 0;
+    virtual const T_GRID_ORDER& Order() const = 0;
     /// Deletes records in one edit. 0 with a message: others use one of them (they are named).
     [[nodiscard]] virtual int OnDelete(const std::vector<std::size_t>& rows) = 0;
 };
@@ -56,11 +67,20 @@ enum class EXPLORER_TABLE {
     UlfConstraints,
     UlfItems,
     UlfStageItems,
+    Modes,
+    Diaphragms,
+    EqualDisplacements,
+    InelasticHinges,
+    IncrementFunctions,
+    LimitStateSteps,
     Count
 };
 
 /// Key of a table's title.
 const char* TitleKey(EXPLORER_TABLE table);
+/// The kind of its records, and the table of a kind; empty: the model has one record of it.
+RECORD_KIND KindOfTable(EXPLORER_TABLE table);
+std::optional<EXPLORER_TABLE> TableOfKind(RECORD_KIND kind);
 /// Number of its records.
 std::size_t RecordCount(const CDBDoc& doc, EXPLORER_TABLE table);
 bool RecordExists(const CDBDoc& doc, EXPLORER_TABLE table, int key);

@@ -3,6 +3,8 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_db/editscope.h"
+#include "qm_db/recordform.h"
+#include "qm_rps/desk/gridorder.h"
 #include "qm_rps/desk/recordcolumns.h"
 #include "qm_rps/dialog/unithead.h"
 
@@ -11,10 +13,8 @@
 template <class R>
 class CRecordTable : public CRecordGrid {
 public:
-    /// makeNew: a new record for the next key (1 more than the last); empty: none can be added.
-    CRecordTable(CDBDoc& doc, const char* title, T_RECORD_COLUMNS<R> columns,
-                 std::function<R(const T_MODEL&, int key)> makeNew = {})
-        : m_doc(doc), m_title(title), m_columns(std::move(columns)), m_makeNew(std::move(makeNew))
+    CRecordTable(CDBDoc& doc, const char* title, T_RECORD_COLUMNS<R> columns)
+        : m_doc(doc), m_title(title), m_columns(std::move(columns))
     {
     }
 
@@ -45,8 +45,13 @@ public:
     int KeyOf(std::size_t row) const override { return row < Keys().size() ? Keys()[row] : 0; }
     long RowOf(int key) const override
     {
-        const auto it = std::ranges::lower_bound(Keys(), key);
-        return it == Keys().end() || *it != key ? -1 : static_cast<long>(it - Keys().begin());
+        const auto& keys = Keys();
+        if (IsByKey()) {
+            const auto it = std::ranges::lower_bound(keys, key);
+            return it == keys.end() || *it != key ? -1 : static_cast<long>(it - keys.begin());
+        }
+        const auto it = std::ranges::find(keys, key);
+        return it == keys.end() ? -1 : static_cast<long>(it - keys.begin());
     }
 
     int SetCellText(std::size_t row, std::size_t c, const std::string& text) override
@@ -66,41 +71,80 @@ public:
         });
     }
 
-    bool CanAdd() const override { return m_makeNew != nullptr; }
     int OnAdd() override
     {
-        if (!m_makeNew) return 0;
-        const int key = NextKey(TableOf<R>(Model()));
-        return Edit([&](CEditScope& edit) { return edit.Put(key, m_makeNew(Model(), key)); });
+        std::string reason;
+        if (MakeRecord(m_doc, KindOf<R>(), {}, m_made, reason)) return 1;
+        ShowMessage("IDS_QM_UI_RECORD_REFUSED", reason);
+        return 0;
     }
+    int MadeKey() const override { return m_made; }
 
     int OnDelete(const std::vector<std::size_t>& rows) override
     {
         std::vector<int> keys;
         for (const std::size_t row : rows)
             if (KeyOf(row) != 0) keys.push_back(KeyOf(row));
+        std::string reason;
         if (keys.empty()) return 0;
-        return Edit([&](CEditScope& edit) {
-            return std::ranges::all_of(keys, [&](int key) { return EraseOne(edit, key) != 0; });
-        });
+        if (DeleteRecords(m_doc, KindOf<R>(), keys, reason)) return 1;
+        ShowMessage("IDS_QM_UI_RECORD_REFUSED", reason);
+        return 0;
     }
+
+    void SetOrder(const T_GRID_ORDER& order) override
+    {
+        if (order == m_order) return;
+        m_order = order;
+        m_revision = -1;
+    }
+    const T_GRID_ORDER& Order() const override { return m_order; }
 
 private:
     const T_MODEL& Model() const { return m_doc.Data().Model(); }
 
+    bool IsByKey() const { return m_order.column < 0 && !m_order.falling; }
     const std::vector<int>& Keys() const
     {
         if (m_revision != m_doc.Data().Revision()) {
-            m_keys = m_doc.Attr().template GetKeys<R>();
             m_revision = m_doc.Data().Revision();
+            m_readKey = 0;
+            m_keys = m_doc.Attr().template GetKeys<R>();
+            if (!m_order.filter.empty()) std::erase_if(m_keys, [&](int k) { return !Passes(k); });
+            if (!IsByKey()) OrderKeys(m_keys, m_order.falling, TextsOfColumn());
         }
         return m_keys;
     }
-    R Read(int key) const
+    std::string TextOf(int key, std::size_t c) const
     {
-        R record = TableOf<R>(Model()).at(key);
-        RecordFromSi(record, m_doc.Unit().Units());
-        return record;
+        return m_columns[c].get(Model(), key, Read(key));
+    }
+    bool Passes(int key) const
+    {
+        for (std::size_t c = 0; c < m_columns.size(); ++c)
+            if (HoldsText(TextOf(key, c), m_order.filter)) return true;
+        return false;
+    }
+    std::vector<std::string> TextsOfColumn() const
+    {
+        std::vector<std::string> texts;
+        const auto column = static_cast<std::size_t>(std::max(m_order.column, 0));
+        for (const int key : m_keys)
+            texts.push_back(column < m_columns.size() ? TextOf(key, column) : std::string());
+        return texts;
+    }
+    /// In current units; kept for the other cells of the row.
+    const R& Read(int key) const
+    {
+        if (m_readKey != key || m_readRevision != m_doc.Data().Revision()) {
+            m_read = TableOf<R>(Model()).at(key);
+            // Digits as they were entered, and values that an edit of another one leaves alone.
+            const T_UNITS& units = m_doc.Unit().Units();
+            ForEachQuantity(m_read, [&](double& v, T_DIM d) { v = ShortFromSi(v, units, d); });
+            m_readKey = key;
+            m_readRevision = m_doc.Data().Revision();
+        }
+        return m_read;
     }
     int Say(const char* key)
     {
@@ -126,24 +170,14 @@ private:
             kKey, zql::lib::MMSGFunction::Format(kKey, {text, ColumnHead(c), std::to_string(key)}));
         return 0;
     }
-    int EraseOne(CEditScope& edit, int key)
-    {
-        T_RECORD_USERS users;
-        if (edit.Erase<R>(key, users)) return 1;
-        std::string names;
-        constexpr std::size_t kNamed = 10;
-        for (std::size_t i = 0; i < users.size() && i < kNamed; ++i)
-            names += (i ? ", " : "") + DescribeUser(Model(), users[i]);
-        if (users.size() > kNamed) names += ", ...";
-        constexpr const char* kKey = "IDS_QM_UI_RECORD_USED";
-        ShowMessage(kKey, zql::lib::MMSGFunction::Format(kKey, {std::to_string(key), names}));
-        return 0;
-    }
-
     CDBDoc& m_doc;
     const char* m_title;
     T_RECORD_COLUMNS<R> m_columns;
-    std::function<R(const T_MODEL&, int)> m_makeNew;
+    T_GRID_ORDER m_order;
+    int m_made = 0;
     mutable std::vector<int> m_keys;
+    mutable R m_read{};
+    mutable int m_readKey = 0;
+    mutable long m_readRevision = -1;
     mutable long m_revision = -1;
 };

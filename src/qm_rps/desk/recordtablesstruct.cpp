@@ -122,12 +122,7 @@ T_RECORD_COLUMNS<T_MATL_D> MaterialColumns()
 
 std::unique_ptr<CRecordGrid> MakeNodeGrid(CDBDoc& doc, const char* title)
 {
-    return std::make_unique<CRecordTable<T_NODE_D>>(doc, title, NodeColumns(),
-                                                    [](const T_MODEL&, int key) {
-                                                        T_NODE_D node;
-                                                        node.id = key;
-                                                        return node;
-                                                    });
+    return std::make_unique<CRecordTable<T_NODE_D>>(doc, title, NodeColumns());
 }
 
 std::unique_ptr<CRecordGrid> MakeElementGrid(CDBDoc& doc, const char* title)
@@ -137,22 +132,12 @@ std::unique_ptr<CRecordGrid> MakeElementGrid(CDBDoc& doc, const char* title)
 
 std::unique_ptr<CRecordGrid> MakeSectionGrid(CDBDoc& doc, const char* title)
 {
-    return std::make_unique<CRecordTable<T_SECT_D>>(
-        doc, title, SectionColumns(), [](const T_MODEL& model, int key) {
-            T_SECT_D section;
-            section.name = FreeName(model.sections, key);
-            return section;
-        });
+    return std::make_unique<CRecordTable<T_SECT_D>>(doc, title, SectionColumns());
 }
 
 std::unique_ptr<CRecordGrid> MakeMaterialGrid(CDBDoc& doc, const char* title)
 {
-    return std::make_unique<CRecordTable<T_MATL_D>>(
-        doc, title, MaterialColumns(), [](const T_MODEL& model, int key) {
-            T_MATL_D material;
-            material.name = FreeName(model.materials, key);
-            return material;
-        });
+    return std::make_unique<CRecordTable<T_MATL_D>>(doc, title, MaterialColumns());
 }
 
 std::unique_ptr<CRecordGrid> MakeStoreyGrid(CDBDoc& doc, const char* title)
