@@ -16,7 +16,7 @@
 namespace {
 
 constexpr int kRowRole = Qt::UserRole;
-constexpr int kValue = 1; // column
+constexpr int kValue = 1, kUnit = 2; // columns
 
 QString Text(const char* key)
 {
@@ -120,14 +120,16 @@ CPropertyPane::CPropertyPane(CDBDoc& doc, QWidget* parent)
         buttons->addWidget(button);
     buttons->addStretch();
     layout->addLayout(buttons);
-    m_tree->setColumnCount(2);
+    m_tree->setColumnCount(3);
     m_tree->setAlternatingRowColors(true);
     m_tree->setItemDelegateForColumn(kValue, new CPropertyDelegate(m_model, m_tree));
     m_tree->setEditTriggers(QAbstractItemView::NoEditTriggers);
     m_tree->setSelectionBehavior(QAbstractItemView::SelectRows);
     m_tree->header()->setSectionResizeMode(0, QHeaderView::Interactive);
-    m_tree->header()->setStretchLastSection(true);
-    m_tree->header()->resizeSection(0, 190);
+    m_tree->header()->setStretchLastSection(false);
+    m_tree->header()->setSectionResizeMode(kValue, QHeaderView::Stretch);
+    m_tree->header()->setSectionResizeMode(kUnit, QHeaderView::ResizeToContents);
+    m_tree->header()->resizeSection(0, 175);
     connect(m_tree, &QTreeWidget::itemChanged, this, [this](QTreeWidgetItem* item) {
         if (!m_quiet) TakeText(item);
     });
@@ -168,6 +170,7 @@ void CPropertyPane::MakeRow(QTreeWidgetItem* item, std::size_t row)
     item->setText(kValue, number ? LocalNumberText(property.value)
                                  : QString::fromStdString(property.value));
     item->setToolTip(kValue, item->text(kValue).size() > 40 ? item->text(kValue) : QString());
+    item->setText(kUnit, QString::fromStdString(property.unit));
     item->setData(0, kRowRole, QVariant::fromValue<qulonglong>(row));
     Qt::ItemFlags flags = Qt::ItemIsSelectable | Qt::ItemIsEnabled;
     if (HasText(property.row)) flags |= Qt::ItemIsEditable;
@@ -255,7 +258,8 @@ void CPropertyPane::Remove()
 
 void CPropertyPane::Retranslate()
 {
-    m_tree->setHeaderLabels({Text("IDS_QM_PROP_MEMBER"), Text("IDS_QM_PROP_VALUE")});
+    m_tree->setHeaderLabels(
+        {Text("IDS_QM_PROP_MEMBER"), Text("IDS_QM_PROP_VALUE"), Text("IDS_QM_PROP_UNIT")});
     m_tree->setAccessibleName(Text("IDS_QM_UI_PROPERTIES"));
     m_add->setText(Text("IDS_QM_PROP_ADD"));
     m_remove->setText(Text("IDS_QM_PROP_REMOVE"));

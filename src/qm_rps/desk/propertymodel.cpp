@@ -23,6 +23,13 @@ std::string ValueOf(const T_FIELD_ROW& row)
     return row.target.empty() ? row.text : row.text + "  " + row.target;
 }
 
+/// "kN/m2"; empty: a ratio, a text.
+std::string UnitOf(const T_FIELD_ROW& row, const T_UNITS& units)
+{
+    const std::string head = FieldHead({}, row, units); // " (kN/m2)"
+    return head.size() < 4 ? std::string() : head.substr(2, head.size() - 3);
+}
+
 } // namespace
 
 void CPropertyModel::Choose(RECORD_KIND kind, std::vector<int> keys)
@@ -83,8 +90,8 @@ const std::vector<T_PROPERTY>& CPropertyModel::Rows()
         const bool differs = std::ranges::find(various, row.path) != various.end();
         const std::string label =
             item ? std::to_string(std::stoul(row.key) + 1) : FieldLabel(row.key);
-        m_rows.push_back({FieldHead(label, row, units),
-                          differs ? Say("IDS_QM_PROP_VARIOUS") : ValueOf(row), differs, row});
+        m_rows.push_back({label, differs ? Say("IDS_QM_PROP_VARIOUS") : ValueOf(row),
+                          UnitOf(row, units), differs, row});
     }
     return m_rows;
 }
