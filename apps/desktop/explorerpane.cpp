@@ -44,6 +44,9 @@ CExplorerPane::CExplorerPane(CDBDoc& doc, CSelection& selection, zql::frx::IDial
         line->addWidget(button);
     m_layout->setContentsMargins(2, 2, 2, 2);
     m_layout->addLayout(line);
+    constexpr int kLeastLetters = 12; // a narrow window has room for the rest
+    m_list->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon);
+    m_list->setMinimumContentsLength(kLeastLetters);
     m_filter->setClearButtonEnabled(true);
     m_decimals->setRange(kAllDigits, kMostDecimals);
     m_decimals->setValue(kAllDigits);

@@ -314,7 +314,9 @@ bool CModelTreePane::eventFilter(QObject* object, QEvent* event)
             {Qt::Key_Return, &CModelTreePane::Open},
             {Qt::Key_Enter, &CModelTreePane::Open}};
         const auto it = keys.find(key);
-        if (plain && it != keys.end()) {
+        // The Enter that ends a name comes here too, from its editor.
+        const bool editing = m_tree->viewport()->findChild<QLineEdit*>() != nullptr;
+        if (plain && !editing && it != keys.end()) {
             (this->*it->second)();
             return true;
         }

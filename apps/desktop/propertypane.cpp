@@ -129,7 +129,9 @@ CPropertyPane::CPropertyPane(CDBDoc& doc, QWidget* parent)
     m_tree->header()->setStretchLastSection(false);
     m_tree->header()->setSectionResizeMode(kValue, QHeaderView::Stretch);
     m_tree->header()->setSectionResizeMode(kUnit, QHeaderView::ResizeToContents);
-    m_tree->header()->resizeSection(0, 175);
+    constexpr int kMembers = 150, kLeast = 300; // pixels
+    m_tree->header()->resizeSection(0, kMembers);
+    setMinimumWidth(kLeast);
     connect(m_tree, &QTreeWidget::itemChanged, this, [this](QTreeWidgetItem* item) {
         if (!m_quiet) TakeText(item);
     });

@@ -136,6 +136,19 @@ TEST_F(Browser, RecordsAreRenamedFoundAndDeletedInTheTree)
     EXPECT_EQ(2u, Model().sections.size());
 }
 
+TEST_F(Browser, TheEnterThatEndsANameOpensNoWindow)
+{
+    Tree().Show(KindOf<T_MATL_D>(), 1);
+    Tree().Rename();
+    auto* const editor = Tree().Tree().viewport()->findChild<QLineEdit*>();
+    ASSERT_TRUE(editor);
+    CAnswers none({});
+    editor->setText("C16");
+    Key(editor, Qt::Key_Return);
+    Settle();
+    EXPECT_EQ("C16", Model().materials.at(1).name);
+}
+
 TEST_F(Browser, ATableIsSortedFilteredShownWithDecimalsAndCopiedWhole)
 {
     Table().Choose(EXPLORER_TABLE::Nodes);
