@@ -6,9 +6,9 @@
 #include "qm_rps/desk/selection.h"
 
 struct T_PROPERTY {
-    std::string label; // "Dimensions"
-    std::string value; // as a person reads it
-    std::string unit;  // "m"
+    std::string label;    // "Dimensions"
+    std::string value;    // as a person reads it
+    std::string unit;     // "m"
     bool various = false; // of several records; an edit goes to all
     T_FIELD_ROW row;
 };
