@@ -3,7 +3,7 @@
 #pragma once
 
 #include "qm_rps/dialog/texttable.h"
-#include "qm_rps/factors/ulfdeck.h"
+#include "qm_rps/factors/tuning/ulfdeck.h"
 #include "qm_rps/ulfitemdialog.h"
 #include "qm_rps/ulfiterationrundlg.h"
 

@@ -1,4 +1,4 @@
-#include "qm_rps/factors/ulfdeck.h"
+#include "qm_rps/factors/tuning/ulfdeck.h"
 
 #include "qm_base/msgfunction.h"
 #include "qm_rps/factors/ulfstageproblem.h"
