@@ -36,7 +36,11 @@ public:
     CAutosave& operator=(const CAutosave&) = delete;
 
     /// Least time between two copies, s; kIntervalS until then.
-    void SetInterval(double seconds) { m_intervalS = seconds; }
+    void SetInterval(double seconds)
+    {
+        m_dueS += seconds - m_intervalS; // the next copy, too
+        m_intervalS = seconds;
+    }
     /// Copies go beside this file from now on; numbers go on after those that are there. The
     /// copies of the file before stay as they are: Remove comes first where they are not wanted.
     void Follow(const std::string& file);

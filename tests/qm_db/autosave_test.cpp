@@ -107,6 +107,16 @@ TEST_F(Autosave, WritesAtMostEveryTwentySecondsAndOnlyWhatChanged)
     EXPECT_EQ(AUTOSAVE::Written, Tick(3001.0));
 }
 
+TEST_F(Autosave, AnotherIntervalHoldsAtOnce)
+{
+    EXPECT_EQ(AUTOSAVE::Nothing, Tick(0.0));
+    m_autosave->SetInterval(60.0);
+    Move(2.0);
+    EXPECT_EQ(AUTOSAVE::Nothing, Tick(30.0));
+    m_autosave->SetInterval(5.0);
+    EXPECT_EQ(AUTOSAVE::Written, Tick(30.0));
+}
+
 TEST_F(Autosave, KeepsThreeAndNumbersGoOn)
 {
     for (const double x : {2.0, 3.0, 4.0, 5.0, 6.0})
