@@ -90,11 +90,13 @@ CResultsPane::CResultsPane(CFramePane& frame, QWidget* parent)
                             static_cast<QWidget*>(m_chosen), static_cast<QWidget*>(m_copy),
                             static_cast<QWidget*>(m_export)})
         bar->addWidget(widget);
-    bar->addWidget(m_note, 1);
+    bar->addStretch();
     auto* layout = new QVBoxLayout(this);
     layout->setContentsMargins(4, 4, 4, 4);
     layout->addLayout(bar);
+    layout->addWidget(m_note);
     layout->addWidget(m_view, 1);
+    m_view->setMinimumSize(480, 6 * kRowHeight);
     auto* sorted = new QSortFilterProxyModel(this);
     sorted->setSourceModel(m_model);
     sorted->setSortRole(Qt::UserRole);
