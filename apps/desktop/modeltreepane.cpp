@@ -1,5 +1,7 @@
 #include "modeltreepane.h"
 
+#include "shell/icons.h"
+
 #include "qm_base/msgfunction.h"
 #include "qm_db/recordform.h"
 
@@ -10,6 +12,8 @@
 #include <QPushButton>
 #include <QVBoxLayout>
 
+#include <algorithm>
+
 namespace {
 
 using W = T_TREE_NODE::WHAT;
@@ -18,6 +22,30 @@ constexpr int kIndexRole = Qt::UserRole;
 QString Text(const char* key)
 {
     return QString::fromStdString(zql::lib::MMSGFunction::GetValue(key));
+}
+
+struct T_KIND_ICON {
+    RECORD_KIND kind;
+    const char* icon;
+};
+constexpr T_KIND_ICON kIcons[] = {
+    {kModelOptionsKind, "settings"},    {KindOf<T_NODE_D>(), "node"},
+    {KindOf<T_ELEM_D>(), "element"},    {KindOf<T_SECT_D>(), "section"},
+    {KindOf<T_MATL_D>(), "material"},   {KindOf<T_STOR_D>(), "storeys"},
+    {KindOf<T_EIGV_D>(), "mode"},       {KindOf<T_STLD_D>(), "load-case"},
+    {KindOf<T_LCOM_D>(), "load"},       {KindOf<T_PHGT_D>(), "hinge-types"},
+    {KindOf<T_PHGE_D>(), "hinge"},      {KindOf<T_SPFC_D>(), "spectrum"},
+    {KindOf<T_POLC_D>(), "push"},       {KindOf<T_EVAL_D>(), "curve"},
+    {KindOf<T_ULFC_D>(), "constraint"}, {KindOf<T_ULFI_D>(), "stay"},
+    {KindOf<T_ULSI_D>(), "iterate"},
+};
+
+/// Of a kind of records, once above them; null: it has none.
+QIcon IconOfNode(const T_TREE_NODE& node)
+{
+    if (node.what != W::Kind) return {};
+    const auto at = std::ranges::find(kIcons, node.kind, &T_KIND_ICON::kind);
+    return at == std::end(kIcons) ? QIcon() : DrawnIcon(QLatin1String(at->icon));
 }
 
 bool IsOnce(RECORD_KIND kind)
@@ -86,6 +114,7 @@ const T_TREE_NODE* CModelTreePane::Current() const
 QTreeWidgetItem* CModelTreePane::MakeItem(const T_TREE_NODE& node)
 {
     auto* item = new QTreeWidgetItem({QString::fromStdString(node.text)});
+    item->setIcon(0, IconOfNode(node));
     item->setData(0, kIndexRole, QVariant::fromValue<qulonglong>(m_nodes.size()));
     m_nodes.push_back(node);
     Qt::ItemFlags flags = Qt::ItemIsSelectable | Qt::ItemIsEnabled;

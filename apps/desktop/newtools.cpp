@@ -27,6 +27,9 @@ void NewFromCurve(T_DESKTOP& desktop)
     CCurveWizardDlg dialog(desktop.doc);
     dialog.SetView(&desktop.view);
     dialog.m_mayReplace = [&desktop] { return desktop.frame.OnNew(); };
+    const std::string dropped = desktop.window->property(kDroppedCurve).toString().toStdString();
+    dialog.m_askFile = [&dropped] { return dropped; };
+    if (!dropped.empty()) (void)dialog.OnFile();
     dialog.m_askFile = [&desktop] {
         return AskFileName(desktop.window, false, Text("IDS_QM_NEW_CURVE_TITLE"),
                            Text("IDS_QM_NEW_CURVE_FILTER"))

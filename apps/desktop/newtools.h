@@ -7,6 +7,9 @@
 
 #include "qm_rps/desk/recordgrid.h"
 
+/// Property of the main window while a file that was dropped on it makes a new model: its path.
+inline constexpr const char* kDroppedCurve = "droppedCurve";
+
 void RegisterNewViews(CViewFactory& factory);
 /// Commands in the order of the menu File. The desktop must outlive them.
 T_COMMANDS NewCommands(T_DESKTOP& desktop);

@@ -1,5 +1,7 @@
 #include "analysis/analysisresults.h"
 
+#include "qm_rps/view/resultgetters.h"
+
 #include "qm_base/say.h"
 
 #include <algorithm>
@@ -28,18 +30,6 @@ std::set<int> HeldNodes(const T_MODEL& model)
     return held;
 }
 
-/// Results of load cases and of construction stages are read by the same steps.
-struct T_GETTERS {
-    int (CPostCtrl::*displacement)(int, T_DOF6&);
-    int (CPostCtrl::*reaction)(int, T_DOF6&);
-    int (CPostCtrl::*truss)(int, double&);
-    int (CPostCtrl::*beam)(int, int, T_DOF6&);
-};
-constexpr T_GETTERS kStatic{&CPostCtrl::GetDispNew, &CPostCtrl::GetReacNew, &CPostCtrl::GetStrtNew,
-                            &CPostCtrl::GetStrbNew};
-constexpr T_GETTERS kStaged{&CPostCtrl::GetDspcNew, &CPostCtrl::GetReccNew, &CPostCtrl::GetStrtcNew,
-                            &CPostCtrl::GetStrbcNew};
-
 struct T_SUM_NAME {
     std::string_view name;
     int key;
@@ -47,7 +37,8 @@ struct T_SUM_NAME {
 constexpr T_SUM_NAME kSums[] = {
     {"sum", kStageLoadSum}, {"dead", kStageLoadDead}, {"erection", kStageLoadErection}};
 
-bool ReadNode(CPostCtrl& post, const T_GETTERS& get, int id, bool isHeld, T_CASE_RESULTS& out)
+bool ReadNode(CPostCtrl& post, const T_RESULT_GETTERS& get, int id, bool isHeld,
+              T_CASE_RESULTS& out)
 {
     T_DOF6 value{};
     if (!(post.*get.displacement)(id, value)) return false;
@@ -58,7 +49,8 @@ bool ReadNode(CPostCtrl& post, const T_GETTERS& get, int id, bool isHeld, T_CASE
     return true;
 }
 
-bool ReadElement(CPostCtrl& post, const T_GETTERS& get, const T_ELEM_D& e, T_CASE_RESULTS& out)
+bool ReadElement(CPostCtrl& post, const T_RESULT_GETTERS& get, const T_ELEM_D& e,
+                 T_CASE_RESULTS& out)
 {
     if (e.kind == ELEM_KIND::Truss) {
         double axial = 0.0;
@@ -122,11 +114,11 @@ bool ReadCaseResults(CDBDoc& doc, const T_SHOWN_CASE& shown, T_CASE_RESULTS& out
     const bool done = post.SelectLoadCombNew(shown.combination) &&
                       std::ranges::all_of(model.nodes,
                                           [&](const auto& n) {
-                                              return ReadNode(post, kStatic, n.first,
+                                              return ReadNode(post, kStaticGetters, n.first,
                                                               held.contains(n.first), out);
                                           }) &&
                       std::ranges::all_of(model.elements, [&](const auto& e) {
-                          return ReadElement(post, kStatic, e.second, out);
+                          return ReadElement(post, kStaticGetters, e.second, out);
                       });
     if (!done) error = post.Error();
     return done;
@@ -169,9 +161,10 @@ bool ReadStageResults(CDBDoc& doc, const T_STAGE_CHOICE& choice, T_CASE_RESULTS&
     post.SelectStage(choice.stage, choice.step, choice.load);
     const bool done =
         std::ranges::all_of(
-            nodes, [&](int id) { return ReadNode(post, kStaged, id, held.contains(id), out); }) &&
+            nodes,
+            [&](int id) { return ReadNode(post, kStageGetters, id, held.contains(id), out); }) &&
         std::ranges::all_of(elements, [&](int id) {
-            return ReadElement(post, kStaged, model.elements.at(id), out);
+            return ReadElement(post, kStageGetters, model.elements.at(id), out);
         });
     if (!done) error = post.Error();
     return done;

@@ -1,6 +1,7 @@
 #include "shell/shell.h"
 
 #include "mainwindow.h"
+#include "newtools.h"
 #include "shell/about.h"
 #include "shell/helptopics.h"
 #include "shell/helpwindow.h"
@@ -282,9 +283,9 @@ void CShell::TakeFile(const QString& path)
         return;
     }
     if (QAction* wizard = m_window.Action(kCurveWizard.c_str())) {
-        m_window.setProperty("droppedCurve", path); // the wizard begins with it
+        m_window.setProperty(kDroppedCurve, path); // the wizard begins with it
         wizard->trigger();
-        m_window.setProperty("droppedCurve", QVariant());
+        m_window.setProperty(kDroppedCurve, QVariant());
         return;
     }
     m_window.Desktop().view.ShowMessage(

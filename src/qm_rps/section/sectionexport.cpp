@@ -1,20 +1,9 @@
 #include "qm_rps/section/sectionexport.h"
 
+#include "qm_rps/dialog/csvcell.h"
+
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
-
-namespace {
-
-std::string Quoted(const std::string& text)
-{
-    if (text.find_first_of(",\"\n") == std::string::npos) return text;
-    std::string out = "\"";
-    for (const char c : text)
-        out += c == '"' ? std::string("\"\"") : std::string(1, c);
-    return out + "\"";
-}
-
-} // namespace
 
 void AppendOfSection(const std::string& section, const std::string& material,
                      const T_TEXT_TABLE& one, T_TEXT_TABLE& all)
@@ -46,11 +35,11 @@ std::string TableCsv(const T_TEXT_TABLE& table)
 {
     std::string text;
     for (std::size_t i = 0; i < table.columns.size(); ++i)
-        text += (i ? "," : "") + Quoted(table.columns[i].head);
+        text += (i ? "," : "") + CsvCell(table.columns[i].head);
     for (const std::vector<std::string>& row : table.rows) {
         text += "\n";
         for (std::size_t i = 0; i < row.size(); ++i)
-            text += (i ? "," : "") + Quoted(row[i]);
+            text += (i ? "," : "") + CsvCell(row[i]);
     }
     return text + "\n";
 }

@@ -1,5 +1,7 @@
 #include "qm_rps/view/resulttable.h"
 
+#include "qm_rps/dialog/csvcell.h"
+
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/view/resultview.h"
@@ -258,18 +260,9 @@ private:
     std::vector<T_LINE_VALUES> m_lines;
 };
 
-std::string Quoted(const std::string& text)
-{
-    if (text.find_first_of(",\"\n") == std::string::npos) return text;
-    std::string out = "\"";
-    for (const char c : text)
-        out += c == '"' ? std::string("\"\"") : std::string(1, c);
-    return out + "\"";
-}
-
 std::string TextOf(const T_RESULT_CELL& cell)
 {
-    return cell.number ? ShortestText(*cell.number) : Quoted(cell.text);
+    return cell.number ? ShortestText(*cell.number) : CsvCell(cell.text);
 }
 
 } // namespace
@@ -288,7 +281,7 @@ std::string CsvText(const T_RESULT_TABLE& table)
 {
     std::string text;
     for (std::size_t c = 0; c < table.heads.size(); ++c)
-        text += (c ? "," : "") + Quoted(table.heads[c]);
+        text += (c ? "," : "") + CsvCell(table.heads[c]);
     text += "\n";
     for (const auto& row : table.rows) {
         for (std::size_t c = 0; c < row.size(); ++c)

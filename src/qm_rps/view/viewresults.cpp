@@ -1,5 +1,7 @@
 #include "qm_rps/view/viewresults.h"
 
+#include "qm_rps/view/resultgetters.h"
+
 #include "qm_base/say.h"
 
 #include <algorithm>
@@ -8,21 +10,9 @@ namespace {
 
 using KIND = T_SHAPE_SOURCE::KIND;
 
-/// Results of load cases and of construction stages are read by the same steps.
-struct T_GETTERS {
-    int (CPostCtrl::*displacement)(int, T_DOF6&);
-    int (CPostCtrl::*reaction)(int, T_DOF6&);
-    int (CPostCtrl::*truss)(int, double&);
-    int (CPostCtrl::*beam)(int, int, T_DOF6&);
-};
-constexpr T_GETTERS kStatic{&CPostCtrl::GetDispNew, &CPostCtrl::GetReacNew, &CPostCtrl::GetStrtNew,
-                            &CPostCtrl::GetStrbNew};
-constexpr T_GETTERS kStaged{&CPostCtrl::GetDspcNew, &CPostCtrl::GetReccNew, &CPostCtrl::GetStrtcNew,
-                            &CPostCtrl::GetStrbcNew};
-
 class CReader {
 public:
-    CReader(CDBDoc& doc, const T_FRAME_SCENE& scene, const T_GETTERS& get)
+    CReader(CDBDoc& doc, const T_FRAME_SCENE& scene, const T_RESULT_GETTERS& get)
         : m_post(doc.Post()), m_units(doc.Unit().Units()), m_model(doc.Data().Model()),
           m_scene(scene), m_get(get)
     {
@@ -100,7 +90,7 @@ private:
     T_UNITS m_units;
     const T_MODEL& m_model;
     const T_FRAME_SCENE& m_scene;
-    const T_GETTERS& m_get;
+    const T_RESULT_GETTERS& m_get;
 };
 
 /// All that the source has of movements, and why it has no forces.
@@ -175,7 +165,7 @@ T_VIEW_RESULTS ReadViewResults(CDBDoc& doc, const T_FRAME_SCENE& scene,
         out.noMoves = out.noForces = out.noReactions = Say("IDS_QM_VIEW_NOT_ANALYSED");
         return out;
     }
-    const CReader reader(doc, scene, staged ? kStaged : kStatic);
+    const CReader reader(doc, scene, staged ? kStageGetters : kStaticGetters);
     reader.ReadMoves(out);
     if (wanted.forces) reader.ReadForces(out);
     if (wanted.reactions) reader.ReadReactions(out);
