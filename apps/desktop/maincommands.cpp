@@ -90,9 +90,15 @@ T_COMMANDS CMainWindow::ViewCommands()
     };
     const auto pane = [this, kMenu](const char* key) {
         auto* dock = findChild<QDockWidget*>(QLatin1String(key));
-        return T_COMMAND{kMenu, key,
-                         "",    [dock] { dock->setVisible(dock->isHidden()); },
-                         {},    [dock] { return !dock->isHidden(); }};
+        return T_COMMAND{kMenu,
+                         key,
+                         "",
+                         [dock] {
+                             dock->setVisible(dock->isHidden());
+                             dock->raise(); // of those that share a place
+                         },
+                         {},
+                         [dock] { return !dock->isHidden(); }};
     };
     using O = T_FRAME_OPTIONS;
     return {{kMenu, "IDS_QM_UI_VIEW_ISO", "Alt+1", look(kIsometric)},

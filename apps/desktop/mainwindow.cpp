@@ -107,6 +107,7 @@ void CMainWindow::MakePanes()
     QDockWidget* results = dock(m_results, "IDS_QM_VIEW_RESULTS", Qt::BottomDockWidgetArea);
     tabifyDockWidget(below, results);
     tabifyDockWidget(results, told);
+    results->hide();
     below->raise();
     setCorner(Qt::BottomLeftCorner, Qt::LeftDockWidgetArea);
     setCorner(Qt::BottomRightCorner, Qt::RightDockWidgetArea);

@@ -10,6 +10,8 @@
 #include "qm_rps/section/sectionexport.h"
 #include "json/jsontext.h"
 
+#include <cstdio>
+
 namespace {
 
 using T_SETTINGS = std::vector<CRecordForm::T_SETTING>;
@@ -166,6 +168,9 @@ EXIT_CODE WriteTable(CDBDoc& doc, const T_RECORD_OPTIONS& o, RECORD_KIND kind)
     if (code == EXIT_CODE::Done && !o.sheet.empty() &&
         !WriteSheet(o.sheet, TableSheet(rows), error))
         code = ReportFileError(error);
+    for (const std::string& path : {o.csv, o.sheet})
+        if (code == EXIT_CODE::Done && !path.empty() && path != "-")
+            std::printf("%s\n", path.c_str());
     return code;
 }
 
@@ -268,5 +273,8 @@ EXIT_CODE RunRecordDelete(const T_RECORD_OPTIONS& o)
             return code;
     std::string reason;
     if (!DeleteRecords(doc, kind, keys, reason)) return Refuse(o, reason);
-    return SaveDocument(doc, o.out);
+    if (const EXIT_CODE code = SaveDocument(doc, o.out); code != EXIT_CODE::Done) return code;
+    for (const std::string& which : o.records)
+        std::printf("%s\n", Say("IDS_QM_CLI_RECORD_DELETED", o.kind, which).c_str());
+    return EXIT_CODE::Done;
 }
