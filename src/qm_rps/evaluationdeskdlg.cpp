@@ -6,6 +6,7 @@
 #include "qm_rps/pushover/overview/evaluationunits.h"
 #include "qm_rps/pushover/report/pushovercells.h"
 #include "qm_rps/pushovercalculators.h"
+#include "qm_rps/spectrumdlg.h"
 
 // ---- the list -----------------------------------------------------------------------------------
 
@@ -144,6 +145,18 @@ int CEvaluationDeskDlg::Follow()
     if (!OnDocumentChanged()) return 0;
     UpdateFrame();
     return 1;
+}
+
+int CEvaluationDeskDlg::OnSpectrum()
+{
+    const auto& spectra = m_doc.Data().Model().spectra;
+    const auto named = std::ranges::find_if(
+        spectra, [this](const auto& entry) { return entry.second.name == m_settings.spectrum; });
+    CSpectrumDlg dialog(m_doc, named == spectra.end() ? 0 : named->first);
+    dialog.SetView(View());
+    const int done = dialog.DoModal();
+    (void)Follow(); // another spectrum may have been stored on the way, too
+    return done;
 }
 
 // ---- what is on show ----------------------------------------------------------------------------

@@ -57,6 +57,10 @@ public:
     /// To be called now and then: takes up what has changed in the document. 1 something had.
     int Follow();
 
+    /// Opens the spectrum of the settings in its window; results follow what is stored there. 1
+    /// the window was left with its changes stored.
+    int OnSpectrum();
+
     // ---- what is on show, in the units shown ----
     T_UNITS ShownUnits() const;
     const T_PUSH_EVALUATION& Result();

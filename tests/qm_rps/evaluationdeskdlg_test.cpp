@@ -1,6 +1,7 @@
 #include "qm_rps/evaluationdeskdlg.h"
 
 #include "pushsample.h"
+#include "qm_rps/spectrumdlg.h"
 #include "scriptview.h"
 
 #include <gtest/gtest.h>
@@ -69,6 +70,21 @@ TEST_F(EvaluationDesk, AnEditOfAStoredEvaluationIsKeptAndUndone)
     EXPECT_EQ(1, m_desk->Follow());
     EXPECT_EQ(std::nullopt, m_desk->m_settings.elasticDamping);
     EXPECT_EQ(std::nullopt, m_desk->Result().eval.elasticDamping);
+}
+
+// On the first line half the demand gives half the base shear, to the 5 % of procedure A.
+TEST_F(EvaluationDesk, ResultsFollowTheSpectrumThatIsEditedBesideThem)
+{
+    const double before = *CardsOf(m_desk->List()[0])[static_cast<std::size_t>(CARD::V)].value;
+    m_view.m_run = [](zql::frx::MDialog& child) {
+        auto& spectrum = dynamic_cast<CSpectrumDlg&>(child);
+        spectrum.m_edit.m_user.Sa = {0.1, 0.1};
+        return spectrum.OnOK();
+    };
+    EXPECT_EQ(1, m_desk->OnSpectrum());
+    const double after = *CardsOf(m_desk->List()[0])[static_cast<std::size_t>(CARD::V)].value;
+    EXPECT_NEAR(0.1 * kWeightStar, after, 0.05 * after);
+    EXPECT_LT(after, 0.6 * before);
 }
 
 TEST_F(EvaluationDesk, WhatIsRefusedOrBearsAnotherNameIsNotKept)

@@ -34,6 +34,8 @@ void BuildMethod(CFormView& form, MODEL& m)
     procedure.shown = [&m] { return !m.m_methodPage.IsTarget(); };
     form.Choice(KeyText("IDS_QM_UI_HEAD_SPECTRUM"), NameRef(s.spectrum, spectra), spectra).name =
         "spectrum";
+    form.Button(KeyText("IDS_QM_EVAL_SPECTRUM"), [&m] { (void)m.OnSpectrum(); }).name =
+        "editSpectrum";
     form.Choice(KeyText("IDS_QM_UI_PUSH_PLOT"),
                 {[&s] { return s.plotType.value_or(static_cast<int>(s.method)); },
                  [&s](const int& i) { s.plotType = i; }},
