@@ -150,6 +150,7 @@ void CExplorerPane::Retranslate()
     m_filter->setAccessibleName(Text("IDS_QM_GRID_FILTER"));
     m_decimalsLabel->setText(Text("IDS_QM_GRID_DECIMALS"));
     m_decimals->setSpecialValueText(Text("IDS_QM_GRID_ALL_DIGITS"));
+    m_decimals->setMinimumWidth(m_decimals->sizeHint().width());
     m_decimals->setAccessibleName(Text("IDS_QM_GRID_DECIMALS"));
     Refresh();
 }
