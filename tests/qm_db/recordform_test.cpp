@@ -159,6 +159,8 @@ TEST(RecordForm, RefusesInWordsAndChangesNothing)
         {KindOf<T_NODE_D>(), "22", "weight", "1", "unknown key"},
         {KindOf<T_ELEM_D>(), "111", "section", "none such", "section: "},
         {KindOf<T_ELEM_D>(), "111", "nodes/1", "4711", "nodes[1]: "},
+        {KindOf<T_ELEM_D>(), "111", "nodes", "1e300", "\"1e300\" is not a number"},
+        {KindOf<T_ELEM_D>(), "111", "nodes", "1.5, 2", "\"1.5\" is not a number"},
         {KindOf<T_SECT_D>(), "column", "name", "beam", "name: "},
         {KindOf<T_SECT_D>(), "column", "fillet", "-1", "fillet: "},
         {kPushControlKind, "0", "steps", "0", "steps: "},

@@ -6,6 +6,8 @@
 #include "qm_db/form/jsontree.h"
 
 #include <algorithm>
+#include <cmath>
+#include <limits>
 
 namespace {
 
@@ -62,10 +64,14 @@ std::string AddIds(const std::string& word, T_JSON_NUMBERS& ids)
     const std::optional<double> first = ParseFinite(word.substr(0, dash));
     const std::optional<double> last =
         dash == std::string::npos ? first : ParseFinite(word.substr(dash + 1));
-    if (!first || !last || *last < *first || *last - *first > kMostAtOnce)
+    const auto isId = [](double value) {
+        return std::fabs(value) <= std::numeric_limits<int>::max() && value == std::floor(value);
+    };
+    if (!first || !last || !isId(*first) || !isId(*last) || *last < *first ||
+        *last - *first > kMostAtOnce)
         return Say("IDS_QM_FORM_NO_NUMBER", Quoted(word));
-    for (double id = *first; id <= *last; ++id)
-        ids.push_back(id);
+    for (long id = std::lround(*first); id <= std::lround(*last); ++id)
+        ids.push_back(static_cast<double>(id));
     return {};
 }
 

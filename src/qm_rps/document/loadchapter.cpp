@@ -61,17 +61,18 @@ private:
     void WriteRows(const std::string& name)
     {
         for (T_ROW& row : m_rows) {
-            std::string times;
-            std::ranges::sort(row.ids);
-            const std::size_t all = row.ids.size();
-            row.ids.erase(std::unique(row.ids.begin(), row.ids.end()), row.ids.end());
-            // Equal loads on one element count each.
-            if (all > row.ids.size()) times = " (" + std::to_string(all) + " x)";
-            m_table.rows.push_back(
-                {name, Say(row.what),
-                 Say(row.ofNodes ? "IDS_QM_REPORT_AT_NODES" : "IDS_QM_REPORT_AT_ELEMENTS",
-                     ElementListText(row.ids)),
-                 row.values + times});
+            std::map<int, std::size_t> times; // equal loads on one element count each
+            for (const int id : row.ids)
+                ++times[id];
+            std::map<std::size_t, std::vector<int>> ids;
+            for (const auto& [id, count] : times)
+                ids[count].push_back(id);
+            for (const auto& [count, some] : ids)
+                m_table.rows.push_back(
+                    {name, Say(row.what),
+                     Say(row.ofNodes ? "IDS_QM_REPORT_AT_NODES" : "IDS_QM_REPORT_AT_ELEMENTS",
+                         ElementListText(some)),
+                     row.values + (count > 1 ? " (" + std::to_string(count) + " x)" : "")});
         }
         m_rows.clear();
         m_found.clear();

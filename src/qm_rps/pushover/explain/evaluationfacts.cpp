@@ -4,6 +4,7 @@
 #include "qm_base/textformat.h"
 #include "qm_db/recordfacts.h"
 #include "qm_rps/pushover/adrsformulas.h"
+#include "qm_rps/pushover/answertrial.h"
 #include "qm_rps/pushover/evaluation/pushtargetinput.h"
 
 #include <cmath>
@@ -221,11 +222,13 @@ void AddTrial(CFactList& list, const T_PERFPT_TRIAL& t, const T_PUSH_EVALUATION&
     taken("Ai", "IDS_QM_FACT_AI", t.Ai, "g", "");
 }
 
-T_FACT_GROUP Trial(const T_PUSH_EVALUATION& e)
+T_FACT_GROUP Trial(const T_PUSH_EVALUATION& e, const T_PERFPT_TRIAL& trial)
 {
     CFactList list(e);
-    AddTrial(list, e.trace.back(), e);
-    return {Say("IDS_QM_FACTS_TRIAL", std::to_string(e.trace.back().trial)), list.Take()};
+    AddTrial(list, trial, e);
+    return {Say(TriesFamily(e) ? "IDS_QM_FACTS_NEAREST_TRIAL" : "IDS_QM_FACTS_TRIAL",
+                std::to_string(trial.trial)),
+            list.Take()};
 }
 
 T_FACT_GROUP Point(const T_PUSH_EVALUATION& e)
@@ -267,7 +270,7 @@ std::vector<T_FACT_GROUP> FactsOf(const T_PUSH_EVALUATION& e)
         AddTargets(e, groups);
         return groups;
     }
-    if (!e.trace.empty()) groups.push_back(Trial(e));
+    if (const T_PERFPT_TRIAL* const trial = AnswerTrial(e)) groups.push_back(Trial(e, *trial));
     if (e.point) groups.push_back(Point(e));
     return groups;
 }

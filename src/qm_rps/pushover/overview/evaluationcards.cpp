@@ -2,17 +2,21 @@
 
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/pushover/answertrial.h"
 
 namespace {
 
-/// Displacement over that of the yield point: of the last trial's bilinear curve, or of the one of
-/// the target displacement.
+/// Displacement over that of the yield point: of the bilinear curve of the answer's trial, or of
+/// the one of the target displacement.
 std::optional<double> DuctilityOf(const T_PUSH_EVALUATION& e)
 {
     const auto over = [](double d, std::optional<double> dy) {
         return dy && *dy > 0.0 ? std::optional(d / *dy) : std::nullopt;
     };
-    if (e.point) return e.trace.empty() ? std::nullopt : over(e.point->Sd, e.trace.back().dy);
+    if (e.point) {
+        const T_PERFPT_TRIAL* const trial = AnswerTrial(e);
+        return trial ? over(e.point->Sd, trial->dy) : std::nullopt;
+    }
     const T_TARGET_DISP* const target = TargetOfAnswer(e);
     return target ? over(target->dt, target->dy) : std::nullopt;
 }

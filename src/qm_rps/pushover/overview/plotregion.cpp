@@ -1,5 +1,7 @@
 #include "qm_rps/pushover/overview/plotregion.h"
 
+#include "qm_rps/pushover/answertrial.h"
+
 #include "qm_rps/pushover/overview/evaluationentry.h"
 
 #include <algorithm>
@@ -32,7 +34,7 @@ void TakePoints(T_EXTENT& extent, const T_PUSH_EVALUATION& e)
     for (const T_GUIDE_LINE& line : e.guideLines)
         if (line.kind == T_GUIDE_LINE::KIND::Demand) extent.Take(line.Sd, 0.0);
     if (e.bilinear) extent.Take(e.bilinear->dy, e.bilinear->ay);
-    if (!e.trace.empty()) extent.Take(e.trace.back().dpi, e.trace.back().api);
+    if (const T_PERFPT_TRIAL* const trial = AnswerTrial(e)) extent.Take(trial->dpi, trial->api);
 }
 
 /// The heights that a curve reaches up to Sd.

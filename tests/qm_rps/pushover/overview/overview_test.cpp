@@ -165,6 +165,22 @@ TEST(Overview, OtherUnitsChangeLengthsAndForcesAlone)
     EXPECT_EQ(metric.factors.gamma, e.factors.gamma);
 }
 
+// Procedure B of ATC-40 goes on to the end of its family: the ductility at 0.15 m is that of the
+// trial at 0.14 m, 0.15 / 0.05, not 0.15 / 0.1 of the one at 0.5 m.
+TEST(Overview, AFamilyOfTrialsIsReadAtThePointNotAtItsEnd)
+{
+    T_PUSH_EVALUATION e = Point();
+    T_PERFPT_TRIAL end = e.trace.back();
+    e.trace.back().dpi = 0.14;
+    end.dpi = 0.5;
+    end.dy = 0.1;
+    e.trace.push_back(end);
+    EXPECT_DOUBLE_EQ(1.5, Value(e, CARD::Ductility));
+    e.eval.procedure = 'B';
+    e.procedure = 'B';
+    EXPECT_DOUBLE_EQ(3.0, Value(e, CARD::Ductility));
+}
+
 TEST(Overview, FactsStandWithDefinitionClauseAndNumbers)
 {
     T_PUSH_EVALUATION e = Point();
