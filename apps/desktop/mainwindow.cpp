@@ -1,6 +1,7 @@
 #include "mainwindow.h"
 
 #include "newtools.h"
+#include "pushoverwindow.h"
 #include "resultspane.h"
 #include "shell/menus.h"
 #include "shell/shell.h"
@@ -47,6 +48,7 @@ CMainWindow::CMainWindow()
 {
     RegisterViews(m_factory);
     m_frame.SetView(&m_view);
+    m_frame.m_mayLeave = [this] { return CPushOverWindow::MayLeave(*this); };
     m_frame.m_askPath = [this] { return AskSavePath().toStdString(); };
     const QString language = QSettings().value(kLanguageKey, "en").toString();
     (void)MMSGFunction::SetLanguage(language.toStdString());

@@ -135,6 +135,13 @@ CPushOverWindow::~CPushOverWindow()
     KeepAxes(m_desk.m_axes);
 }
 
+bool CPushOverWindow::MayLeave(const QWidget& mainWindow)
+{
+    auto* window =
+        dynamic_cast<CPushOverWindow*>(mainWindow.findChild<QWidget*>(QLatin1String(kName)));
+    return !window || !window->isVisible() || !window->m_desk.HasUnsaved() || window->close();
+}
+
 CPushOverWindow& CPushOverWindow::Show(T_DESKTOP& desktop)
 {
     auto* window =

@@ -14,6 +14,8 @@ class CPushOverWindow : public CDialogWindow {
 public:
     /// Of the desktop's main window, made if there is none yet; shown and in front.
     static CPushOverWindow& Show(T_DESKTOP& desktop);
+    /// Closes it where it holds an evaluation that is not stored, which asks. False: it stays.
+    static bool MayLeave(const QWidget& mainWindow);
     /// Made, not shown.
     static std::unique_ptr<CPushOverWindow> Make(T_DESKTOP& desktop, QWidget* parent);
     ~CPushOverWindow() override;

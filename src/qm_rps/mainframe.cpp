@@ -130,6 +130,7 @@ std::string CMainFrame::SavePath() const
 /// Edits are saved or given up; false: the person wants to go on with the document.
 bool CMainFrame::MayReplace()
 {
+    if (m_mayLeave && !m_mayLeave()) return false;
     FollowSaves();
     if (!m_doc.Data().IsModified()) return true;
     constexpr const char* kKey = "IDS_QM_UI_SAVE_CHANGES";

@@ -53,6 +53,9 @@ public:
 
     /// Asks for the name of a file to save to; empty: cancelled.
     std::function<std::string()> m_askPath;
+    /// Asked before the document goes or the program ends: windows with something that is not in
+    /// the document offer to store it. False: the person wants to go on with them.
+    std::function<bool()> m_mayLeave;
 
 private:
     int Refuse(const std::string& text);

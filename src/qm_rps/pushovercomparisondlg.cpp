@@ -4,6 +4,7 @@
 #include "qm_base/textformat.h"
 #include "qm_db/recordfacts.h"
 #include "qm_rps/desk/recordnames.h"
+#include "qm_rps/pushover/outcometext.h"
 #include "qm_rps/pushovercalculators.h"
 
 using zql::lib::MMSGFunction;
@@ -53,7 +54,7 @@ T_TEXT_TABLE CPushOverComparisonDlg::Cells() const
         const auto value = [&](double v) { return row.found ? FormatText("%.5g", v) : "-"; };
         t.rows.push_back({row.label, value(row.D), value(row.V), value(row.Sd), value(row.Sa),
                           row.found ? FormatText("%.3f", row.D / m_comparison.meanD) : "-",
-                          OutcomeName(row.outcome)});
+                          OutcomeText(row.outcome)});
     }
     return t;
 }

@@ -48,7 +48,6 @@ T_REPORT_OPTIONS CReportDlg::Options() const
         if (m_chosen[i]) options.only.push_back(static_cast<REPORT_CHAPTER>(i));
     options.mostRows = static_cast<std::size_t>(m_rows);
     options.fileName = std::filesystem::path(m_doc.Path()).filename().string();
-    if (!m_doc.Data().IsModified()) options.fileHash = m_fileHash;
     return options;
 }
 
@@ -64,13 +63,17 @@ int CReportDlg::OnMake()
         ShowMessage(m_rows < 0 ? "IDS_QM_UI_REPORT_ROWS_REFUSED" : "IDS_QM_UI_REPORT_NO_CHAPTER");
         return 0;
     }
+    // What the person sets here does not change what the file says of the structure.
+    const bool isSaved = !m_doc.Data().IsModified() || m_hashRevision == m_doc.Data().Revision();
     if (!Keep()) {
         ShowMessage("IDS_QM_UI_REPORT_NOT_KEPT");
         return 0;
     }
-    const auto make = [this](const TELL_FN& tell) {
+    m_hashRevision = isSaved ? m_doc.Data().Revision() : -1;
+    const auto make = [this, isSaved](const TELL_FN& tell) {
         T_REPORT_OPTIONS options = Options();
         options.progress = tell;
+        if (isSaved) options.fileHash = m_fileHash;
         return MakeModelReport(m_doc, options, m_document);
     };
     if (!(m_run ? m_run(make) : make({}))) return 0;

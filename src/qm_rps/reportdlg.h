@@ -52,6 +52,7 @@ private:
     T_REPORT_D m_madeHead;
     std::array<bool, kReportChapterNames.size()> m_madeChosen{};
     int m_madeRows = 0;
+    long m_hashRevision = -1; // of the document that differs from its file by settings alone
     long m_madeRevision = -1;
     int m_times = 0;
 };

@@ -143,3 +143,16 @@ TEST_F(MainFrame, ASaveOverSomebodyElsesChangesIsAsked)
         m_window->answers.m_answer = ANSWER::Cancel;
     }
 }
+
+TEST_F(MainFrame, WindowsWithDraftsAreAskedBeforeTheDocumentGoes)
+{
+    int asked = 0;
+    bool may = false;
+    m_window->frame.m_mayLeave = [&] { return ++asked, may; };
+    EXPECT_EQ(0, m_window->frame.OnNew());
+    EXPECT_EQ(0, m_window->frame.OnClose());
+    EXPECT_EQ(2, asked);
+    EXPECT_EQ(1u, m_window->doc.Data().Model().nodes.size());
+    may = true;
+    EXPECT_EQ(1, m_window->frame.OnClose());
+}

@@ -1,5 +1,6 @@
 #include "qm_rps/reportdlg.h"
 
+#include "qm_db/editscope.h"
 #include "tempfolder.h"
 
 #include <algorithm>
@@ -57,4 +58,30 @@ TEST(ReportDlg, SaysWhereTheModelCantKeepThem)
     EXPECT_EQ("IDS_QM_UI_REPORT_NOT_KEPT", dlg.Messages().back().key);
     EXPECT_FALSE(dlg.IsMade());
     doc.Edit().Rollback();
+}
+
+// The title block is kept in the model; the file says the same of the structure as before.
+TEST(ReportDlg, TheFileIsKnownByItsHashUntilTheStructureChanges)
+{
+    CDBDoc doc;
+    const CTempFolder folder;
+    T_FILE_ERROR error;
+    ASSERT_EQ(1, doc.SaveAs(folder / "m.qmdb", error)) << error.text;
+    CReportDlg dlg(doc);
+    dlg.m_fileHash = "0123abcd";
+    const auto names = [&dlg] {
+        return std::ranges::any_of(
+            dlg.Document().head, [](const T_DOC_HEAD_ROW& row) { return row.value == "0123abcd"; });
+    };
+    for (const char* author : {"A. Engineer", "B. Engineer"}) {
+        dlg.m_head.author = author;
+        ASSERT_EQ(1, dlg.OnMake());
+        EXPECT_TRUE(names()) << author;
+    }
+    CEditScope edit(doc, "node");
+    T_NODE_D node;
+    node.id = 1;
+    ASSERT_TRUE(edit.Put(1, node) && edit.Commit());
+    ASSERT_EQ(1, dlg.OnMake());
+    EXPECT_FALSE(names());
 }

@@ -118,7 +118,11 @@ void CDialogWindow::ShowTexts()
 void CDialogWindow::changeEvent(QEvent* event)
 {
     QDialog::changeEvent(event);
-    if (event->type() == QEvent::LanguageChange) ShowTexts();
+    if (event->type() != QEvent::LanguageChange) return;
+    ShowTexts();
+    // The box of the buttons gets its own event after this one, and writes its own words.
+    QMetaObject::invokeMethod(
+        this, [this] { ShowTexts(); }, Qt::QueuedConnection);
 }
 
 /// What the form needs without scrolling, within nine tenths of the screen.

@@ -2,6 +2,7 @@
 
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/pushover/outcometext.h"
 #include "qm_ui/pushover/adrscurve.h"
 #include "qm_ui/pushover/evaluationplot.h"
 
@@ -38,7 +39,7 @@ void AddNotes(T_PLOT& plot, const T_PUSH_COMPARISON& c, const std::string& unit)
     for (const T_COMPARISON_ROW& row : c.rows)
         plot.notes.push_back(
             row.found ? FormatText("%s: D = %.4g %s", row.label.c_str(), row.D, unit.c_str())
-                      : row.label + ": " + OutcomeName(row.outcome));
+                      : row.label + ": " + OutcomeText(row.outcome));
     if (c.count > 0)
         plot.notes.push_back(MMSGFunction::Format(
             "IDS_QM_UI_PLOT_SPREAD", {FormatText("%.4g", c.minD), FormatText("%.4g", c.maxD), unit,

@@ -3,6 +3,7 @@
 #include "qm_base/msgfunction.h"
 #include "qm_base/textformat.h"
 #include "qm_rps/pushover/adrsformulas.h"
+#include "qm_rps/pushover/outcometext.h"
 #include "qm_rps/pushover/report/pushovercells.h"
 #include "qm_ui/pushover/adrscurve.h"
 
@@ -197,7 +198,7 @@ std::string PlotSubtitle(const T_PUSH_EVALUATION& e)
 void AddEvaluationNotes(T_PLOT& plot, const T_PUSH_EVALUATION& e)
 {
     plot.notes.push_back(MMSGFunction::GetValue("IDS_QM_UI_PLOT_OUTCOME") + ": " +
-                         OutcomeName(e.outcome));
+                         OutcomeText(e.outcome));
     if (e.point) {
         plot.notes.push_back(FormatText("D = %.5g %s", e.point->D, LengthUnit(e).c_str()));
         plot.notes.push_back(FormatText("V = %.5g %s", e.point->V, ForceUnit(e).c_str()));

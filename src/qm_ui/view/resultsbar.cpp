@@ -62,7 +62,8 @@ CResultsBar::CResultsBar(CResultView& view, QWidget* parent)
     m_size->setRange(0.1, 10.0);
     m_size->setSingleStep(0.25);
     m_size->setDecimals(2);
-    m_source->setSizeAdjustPolicy(QComboBox::AdjustToContents);
+    // A long name must not make the window wider than a small screen.
+    m_source->setSizeAdjustPolicy(QComboBox::AdjustToMinimumContentsLengthWithIcon);
     m_source->setMinimumContentsLength(16);
     MakeRows();
     Connect();

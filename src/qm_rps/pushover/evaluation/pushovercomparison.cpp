@@ -45,6 +45,8 @@ T_COMPARISON_ROW RowOf(const std::string& label, const T_LIMIT_ROW* state,
     const std::optional<double> Sa = CapacityAt(e.capacity, Sd);
     if (!Sa) return row; // beyond the push: no force belongs to it
     row.found = true;
+    // That of the whole evaluation may be of another state, which lies beyond the push.
+    if (row.outcome.code == PUSH_OUTCOME::TargetBeyond) row.outcome = {PUSH_OUTCOME::TargetFound};
     row.D = *state->demand;
     row.Sd = Sd;
     row.Sa = *Sa;

@@ -4,6 +4,7 @@
 #include "qm_base/textformat.h"
 #include "qm_db/recordfacts.h"
 #include "qm_rps/pushover/evaluation/pushovercomparison.h"
+#include "qm_rps/pushover/outcometext.h"
 #include "qm_rps/pushover/overview/evaluationcards.h"
 
 #include <algorithm>
@@ -163,7 +164,7 @@ std::string VerdictReason(const T_EVALUATION_ENTRY& entry)
     case EVALUATION_VERDICT::Refused:
         return entry.refused;
     case EVALUATION_VERDICT::NoPoint:
-        return OutcomeName(e.outcome) + ": " + OutcomeAdvice(e.outcome);
+        return OutcomeText(e.outcome) + ": " + OutcomeAdvice(e.outcome);
     case EVALUATION_VERDICT::BeyondPush:
         return Say("IDS_QM_EVAL_WHY_BEYOND");
     case EVALUATION_VERDICT::NotGood:
@@ -193,7 +194,7 @@ std::string ResultText(const T_EVALUATION_ENTRY& entry)
     const T_PUSH_EVALUATION& e = entry.result;
     if (!entry.refused.empty()) return entry.refused;
     const std::optional<T_EVALUATION_ANSWER> answer = AnswerOf(e);
-    if (!answer) return OutcomeName(e.outcome) + ": " + OutcomeAdvice(e.outcome);
+    if (!answer) return OutcomeText(e.outcome) + ": " + OutcomeAdvice(e.outcome);
     std::string text = answer->state.empty() ? std::string() : answer->state + ": ";
     text += ValueText("D", answer->D, NameOf(e.units.length));
     if (answer->V) text += ", " + ValueText("V", *answer->V, NameOf(e.units.force));
