@@ -4,9 +4,10 @@
 
 namespace {
 
-/// x^n / n!
+/// x^n / n!; 0 where n < 0: a constant that was differentiated.
 double Power(double x, int n)
 {
+    if (n < 0) return 0.0;
     double value = 1.0;
     for (int i = 1; i <= n; ++i)
         value *= x / i;
@@ -51,6 +52,14 @@ void CMacaulay::Places(std::vector<double>& out) const
 {
     for (const T_TERM& term : m_terms)
         out.push_back(term.at);
+}
+
+void CMacaulay::AddScaled(const CMacaulay& other, double factor)
+{
+    for (std::size_t n = 0; n < other.m_base.size(); ++n)
+        AddBase(static_cast<int>(n), factor * other.m_base[n]);
+    for (const T_TERM& term : other.m_terms)
+        Add(term.power, term.at, factor * term.factor);
 }
 
 int CMacaulay::Degree() const

@@ -14,9 +14,12 @@ public:
     void Add(int power, double at, double factor);
     /// factor times the integral of another sum from x = 0.
     void AddIntegral(const CMacaulay& other, double factor);
+    /// factor times another sum.
+    void AddScaled(const CMacaulay& other, double factor);
     /// The value at x; where it leaps there, that before the leap, or `behind` it.
     [[nodiscard]] double At(double x, bool behind = false) const { return Integral(0, x, behind); }
-    /// The integral of that order, which is 0 at x = 0 with those of the orders below.
+    /// The integral of that order, which is 0 at x = 0 with those of the orders below. Order -1:
+    /// the slope, -2: that of the slope, without what a leap would add.
     [[nodiscard]] double Integral(int order, double x, bool behind = false) const;
     /// Appends the places of its terms.
     void Places(std::vector<double>& out) const;

@@ -33,7 +33,52 @@ void AddMoments(std::array<CMacaulay, 6>& force)
     force[5].AddIntegral(force[1], -1.0);
 }
 
+/// Where a sum has its extremes between stations, at which alone its pieces end. A piece is a
+/// cubic at most (straight loads, integrated twice): its slope is a parabola and may vanish twice,
+/// so it is halved where the slope turns; in each half one change of sign at most is left.
+void AddExtremes(const CMacaulay& force, double length, std::vector<double>& stations)
+{
+    constexpr int kHalvings = 60;
+    const double step = 2e-6 * length;
+    const auto slope = [&](double x) { return force.Integral(-1, x); };
+    const auto search = [&](double a, double b) {
+        const double atA = slope(a);
+        if (!(b > a) || atA * slope(b) >= 0.0) return;
+        for (int n = 0; n < kHalvings; ++n) {
+            const double middle = 0.5 * (a + b);
+            (slope(middle) * atA > 0.0 ? a : b) = middle;
+        }
+        stations.push_back(0.5 * (a + b));
+    };
+    const std::size_t count = stations.size();
+    for (std::size_t i = 0; i + 1 < count; ++i) {
+        const double a = stations[i] + step, b = stations[i + 1] - step;
+        const double bendA = force.Integral(-2, a), bendB = force.Integral(-2, b);
+        const bool turns = bendA * bendB < 0.0;
+        const double middle = turns ? a + (b - a) * bendA / (bendA - bendB) : b;
+        search(a, middle);
+        search(middle, b);
+    }
+    std::ranges::sort(stations);
+}
+
 } // namespace
+
+std::vector<double> StationsOf(const CMacaulay& force, double length, int parts)
+{
+    std::vector<double> out{0.0, length};
+    force.Places(out);
+    const bool curved = force.Degree() > 1;
+    for (int i = 1; curved && i < parts; ++i)
+        out.push_back(length * i / parts);
+    std::erase_if(out, [&](double x) { return !(x >= 0.0 && x <= length); });
+    std::ranges::sort(out);
+    const auto same = [&](double a, double b) { return b - a <= 1e-9 * length; };
+    out.erase(std::unique(out.begin(), out.end(), same), out.end());
+    if (out.back() < length) out.back() = length;
+    if (curved) AddExtremes(force, length, out);
+    return out;
+}
 
 CMemberLine::CMemberLine(double length, const T_DOF6& atI, std::span<const T_LINE_LOAD> loads)
     : m_length(length)
@@ -104,51 +149,9 @@ bool CMemberLine::FitTo(const T_ELEM_FORCES& analysed)
     return same;
 }
 
-/// Where the slope changes its sign, found between the stations by halving. Between them that of a
-/// moment is the shear, unless something was added to either.
-void CMemberLine::AddExtremes(std::size_t component, std::vector<double>& stations) const
-{
-    constexpr int kHalvings = 60;
-    const CMacaulay& force = m_force[component];
-    const double step = 1e-6 * m_length;
-    const auto rise = [&](double x) { return force.At(x + step) - force.At(x - step); };
-    const CMacaulay& shear = m_force[component == 4 ? 2 : 1];
-    const double sign = component == 4 ? 1.0 : -1.0;
-    const auto isShear = [&](double x) {
-        const double byShear = 2.0 * step * sign * shear.At(x);
-        return component >= 4 && std::fabs(rise(x) - byShear) <= 1e-3 * std::fabs(byShear);
-    };
-    const std::size_t count = stations.size();
-    for (std::size_t i = 0; i + 1 < count; ++i) {
-        double a = stations[i] + 2.0 * step, b = stations[i + 1] - 2.0 * step;
-        const bool sheared = isShear(a) && isShear(b);
-        const auto slope = [&](double x) { return sheared ? sign * shear.At(x) : rise(x); };
-        const double atA = slope(a);
-        if (!(b > a) || atA * slope(b) >= 0.0) continue;
-        for (int n = 0; n < kHalvings; ++n) {
-            const double middle = 0.5 * (a + b);
-            (slope(middle) * atA > 0.0 ? a : b) = middle;
-        }
-        stations.push_back(0.5 * (a + b));
-    }
-    std::ranges::sort(stations);
-}
-
 std::vector<double> CMemberLine::Stations(std::size_t component, int parts) const
 {
-    std::vector<double> out{0.0, m_length};
-    const CMacaulay& force = m_force[component];
-    force.Places(out);
-    const bool curved = force.Degree() > 1;
-    for (int i = 1; curved && i < parts; ++i)
-        out.push_back(m_length * i / parts);
-    std::erase_if(out, [&](double x) { return !(x >= 0.0 && x <= m_length); });
-    std::ranges::sort(out);
-    const auto same = [&](double a, double b) { return b - a <= 1e-9 * m_length; };
-    out.erase(std::unique(out.begin(), out.end(), same), out.end());
-    if (out.back() < m_length) out.back() = m_length;
-    if (curved) AddExtremes(component, out);
-    return out;
+    return StationsOf(m_force[component], m_length, parts);
 }
 
 CDeflectedLine::CDeflectedLine(const CMemberLine& line, const T_LINE_ENDS& ends,

@@ -29,6 +29,11 @@ struct T_LINE_ENDS {
     T_ENDS<T_DIRS6> release;
 };
 
+/// Places of a sum from 0 to the length, cubic at most between its terms: the ends, where it leaps
+/// or bends, all its extremes, and `parts` equal parts where it is curved. Ascending; between two
+/// neighbours it only rises or only falls.
+[[nodiscard]] std::vector<double> StationsOf(const CMacaulay& force, double length, int parts);
+
 class CMemberLine {
 public:
     /// From the forces of the cut at the I-end.
@@ -48,13 +53,10 @@ public:
     /// added, straight between the positions, so that the values there are those of the analysis.
     bool FitTo(const T_ELEM_FORCES& analysed);
 
-    /// Where to take values to draw a component: the ends, places where it leaps or bends, its
-    /// extremes, and `parts` equal parts where it is curved. Ascending; 0 and the length in it.
+    /// Where to take values of a component, see StationsOf.
     [[nodiscard]] std::vector<double> Stations(std::size_t component, int parts) const;
 
 private:
-    void AddExtremes(std::size_t component, std::vector<double>& stations) const;
-
     double m_length = 0.0;
     std::array<CMacaulay, 6> m_force;
 };

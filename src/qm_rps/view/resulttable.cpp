@@ -8,6 +8,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <map>
 
 namespace {
 
@@ -45,6 +46,60 @@ struct T_LINE_VALUES {
     T_DOF6 least{}, most{}; // over the member, where it stands for all of it
     bool whole = false;
 };
+
+struct T_STATION {
+    double x = 0.0, before = 0.0, behind = 0.0;
+    double rounding = 0.0; // what a difference must exceed
+    bool leaps = false;
+};
+
+/// 1 rises, -1 falls, 0 stays from a station to the next.
+int Way(const T_STATION& from, const T_STATION& to)
+{
+    const double rise = to.before - from.behind;
+    if (std::fabs(rise) <= to.rounding) return 0;
+    return rise > 0.0 ? 1 : -1;
+}
+
+/// A component along a member: between two stations it only rises or only falls.
+std::vector<T_STATION> StationsAlong(const CMemberLine& member, std::size_t c)
+{
+    constexpr double kRounding = 1e-9; // of the largest value
+    std::vector<T_STATION> out;
+    double largest = 0.0;
+    for (const double x : member.Stations(c, 1)) {
+        out.push_back({x, member.Force(c, x), member.Force(c, x, true)});
+        largest = std::max({largest, std::fabs(out.back().before), std::fabs(out.back().behind)});
+    }
+    for (T_STATION& at : out) {
+        at.rounding = kRounding * largest;
+        at.leaps = at.x < member.Length() && std::fabs(at.behind - at.before) > at.rounding;
+    }
+    return out;
+}
+
+/// Places that have rows beside the five positions: where My or Mz turns between these, and where
+/// any component leaps (true), at a position too: this one has one side alone.
+std::map<double, bool> PlacesBetween(const CMemberLine& member)
+{
+    constexpr double kAtPosition = 1e-5; // of a quarter
+    std::map<double, bool> out;
+    for (std::size_t c = 0; c < 6; ++c) {
+        const std::vector<T_STATION> along = StationsAlong(member, c);
+        for (std::size_t i = 0; i < along.size(); ++i) {
+            if (along[i].leaps) out[along[i].x] = true;
+            const double quarters = 4.0 * along[i].x / member.Length();
+            if (c < 4 || i == 0 || i + 1 == along.size() ||
+                std::fabs(quarters - std::round(quarters)) <= kAtPosition)
+                continue;
+            if (Way(along[i - 1], along[i]) == Way(along[i], along[i + 1])) continue;
+            const double reach = kAtPosition * member.Length();
+            const auto near = out.lower_bound(along[i].x - reach); // My and Mz may turn together
+            if (near == out.end() || near->first > along[i].x + reach) out[along[i].x] = false;
+        }
+    }
+    return out;
+}
 
 class CTableMaker {
 public:
@@ -153,32 +208,38 @@ private:
         for (std::size_t p = 0; p < analysed.size(); ++p)
             m_lines.push_back({source, id, kPositions[p], analysed[p], {}, {}});
         if (!beam) return;
+        if (!m_choice.envelope) return AddBetween(source, id, PlacesBetween(member), member);
         T_LINE_VALUES whole{source, id, Say("IDS_QM_VIEW_WHOLE_MEMBER"), {}, {}, {}, true};
         whole.least = whole.most = analysed[0];
-        std::set<double> between;
-        for (std::size_t c = 0; c < 6; ++c)
-            for (const double x : member.Stations(c, 1))
-                for (const bool behind : {false, true}) {
-                    const double v = member.Force(c, x, behind);
-                    const bool more = v > whole.most[c], less = v < whole.least[c];
-                    if (more) whole.most[c] = v;
-                    if (less) whole.least[c] = v;
-                    const double quarters = 4.0 * x / member.Length();
-                    if (c >= 4 && (more || less) &&
-                        std::fabs(quarters - std::round(quarters)) > 1e-5)
-                        between.insert(x);
-                }
-        if (m_choice.envelope) {
-            m_lines.push_back(whole);
-            return;
+        for (std::size_t c = 0; c < 6; ++c) {
+            const auto take = [&](double value) {
+                whole.least[c] = std::min(whole.least[c], value);
+                whole.most[c] = std::max(whole.most[c], value);
+            };
+            for (const T_DOF6& at : analysed)
+                take(at[c]);
+            for (const T_STATION& at : StationsAlong(member, c)) {
+                take(at.before);
+                take(at.behind);
+            }
         }
-        for (const double x : between) {
-            T_LINE_VALUES at{source, id, {}, {}, {}, {}};
-            at.position = "x = " + FormatText("%.6g", FromSi(x, m_units, kDimLength));
-            for (std::size_t c = 0; c < 6; ++c)
-                at.values[c] = member.Force(c, x);
-            m_lines.push_back(at);
-        }
+        m_lines.push_back(whole);
+    }
+
+    /// A place has one row, or where something leaps one for each side of it.
+    void AddBetween(std::size_t source, int id, const std::map<double, bool>& places,
+                    const CMemberLine& member)
+    {
+        for (const auto& [x, leaps] : places)
+            for (const bool behind : {false, true}) {
+                if (behind && !leaps) continue;
+                T_LINE_VALUES at{source, id, {}, {}, {}, {}};
+                at.position = "x = " + FormatText("%.6g", FromSi(x, m_units, kDimLength));
+                if (leaps) at.position += behind ? "+" : "-";
+                for (std::size_t c = 0; c < 6; ++c)
+                    at.values[c] = member.Force(c, x, behind);
+                m_lines.push_back(at);
+            }
     }
 
     double Shown(const T_DOF6& values, std::size_t c) const

@@ -27,10 +27,11 @@ struct T_RESULT_TABLE {
     std::vector<std::vector<T_RESULT_CELL>> rows; // as many cells as heads
 };
 
-/// Rows by source and id. Forces stand at I, 1/4, 2/4, 3/4, J, and at places between where My or
-/// Mz has an extreme. An envelope has the smallest and largest value of each component with the
-/// sources that give them; of forces also over the whole member, exact under its loads.
-/// 1 done; 0 `why`: a source has no such results.
+/// Rows by source and id. Forces stand at I, 1/4, 2/4, 3/4, J, at places between where My or
+/// Mz has an extreme, and on both sides ("x = 3-", "x = 3+") of where a component leaps. An
+/// envelope has the smallest and largest value of each component with the sources that give them;
+/// of forces also over the whole member, exact under its loads. 1 done; 0 `why`: a source has no
+/// such results.
 [[nodiscard]] int MakeResultTable(CDBDoc& doc, CFrameScene& scene,
                                   const T_RESULT_TABLE_CHOICE& choice, T_RESULT_TABLE& out,
                                   std::string& why);

@@ -59,6 +59,37 @@ double Extreme(const T_FIBRES& f, double N, double My, double Mz)
     return worst;
 }
 
+/// The largest magnitude along a member: at every extreme of N, My and Mz, on both sides, and of
+/// the sum in each corner of the section, which may lie elsewhere. Round sections bend about both
+/// axes with no such sum: there in many parts, too.
+double LargestAlong(const T_FIBRES& f, const CMemberLine& member)
+{
+    constexpr int kRoundParts = 64;
+    const int parts = f.round ? kRoundParts : 1;
+    std::vector<double> places;
+    const auto take = [&places](const std::vector<double>& more) {
+        places.insert(places.end(), more.begin(), more.end());
+    };
+    for (const std::size_t c : {0U, 4U, 5U})
+        take(member.Stations(c, parts));
+    for (const double z : {-f.half, f.half})
+        for (const double y : {-f.left, f.right}) {
+            if (!f.bends || f.round) continue;
+            CMacaulay corner;
+            corner.AddScaled(member.Series(0), 1.0 / f.area);
+            corner.AddScaled(member.Series(4), z / f.Iyy);
+            corner.AddScaled(member.Series(5), -y / f.Izz);
+            take(StationsOf(corner, member.Length(), parts));
+        }
+    double largest = 0.0;
+    for (const double x : places)
+        for (const bool behind : {false, true})
+            largest = std::max(largest, std::fabs(Extreme(f, member.Force(0, x, behind),
+                                                          member.Force(4, x, behind),
+                                                          member.Force(5, x, behind))));
+    return largest;
+}
+
 } // namespace
 
 T_STRESS_PICTURE StressesOf(const CViewFrame& frame, const T_MODEL& model,
@@ -96,8 +127,9 @@ T_STRESS_PICTURE StressesOf(const CViewFrame& frame, const T_MODEL& model,
             const double value =
                 Extreme(*known->second, member.Force(0, x), member.Force(4, x), member.Force(5, x));
             shown.value.push_back(FromSi(value, units, kDimStress));
-            out.largest = std::max(out.largest, std::fabs(shown.value.back()));
         }
+        const double largest = LargestAlong(*known->second, member);
+        out.largest = std::max(out.largest, FromSi(largest, units, kDimStress));
     }
     return out;
 }

@@ -10,7 +10,7 @@ struct T_LINE_STRESS {
 };
 struct T_STRESS_PICTURE {
     std::string unit;
-    double largest = 0.0; // magnitude
+    double largest = 0.0; // magnitude, wherever along a line it is
     std::vector<T_LINE_STRESS> lines;
     std::size_t unchecked = 0; // lines whose section has no dimensions
 };

@@ -215,10 +215,13 @@ TEST_F(ResultView, TablesHaveExtremesBetweenPositionsAndTheCasesOfAnEnvelope)
     T_RESULT_TABLE table;
     std::string why;
     ASSERT_TRUE(MakeResultTable(doc, scene, choice, table, why)) << why;
-    // DL: five positions. LL: these, and the load's place at 2 m, where My is P a b / L.
-    ASSERT_EQ(11U, table.rows.size());
-    EXPECT_EQ("x = 2000", table.rows[10][2].text);
+    // DL: five positions. LL: these, and both sides of the load at 2 m, where My is P a b / L.
+    ASSERT_EQ(12U, table.rows.size());
+    EXPECT_EQ("x = 2000-", table.rows[10][2].text);
+    EXPECT_NEAR(-8.0, table.rows[10][5].number.value(), 1e-9);
     EXPECT_NEAR(-16000.0, table.rows[10][7].number.value(), 1e-6);
+    EXPECT_EQ("x = 2000+", table.rows[11][2].text);
+    EXPECT_NEAR(4.0, table.rows[11][5].number.value(), 1e-9);
     choice.envelope = true;
     ASSERT_TRUE(MakeResultTable(doc, scene, choice, table, why)) << why;
     const auto row = std::ranges::find_if(
