@@ -1,4 +1,5 @@
 // The arguments of pictures and tables of results.
+#include "finiterange.h"
 #include "registershared.h"
 #include "registrations.h"
 #include "view/viewcommands.h"
@@ -44,9 +45,9 @@ void AddPicture(CLI::App& app, EXIT_CODE& code)
     sub->add_flag("--outline", o->outline, Say("IDS_QM_HELP_PICTURE_OUTLINE"));
     sub->add_flag("--numbers", o->numbers, Say("IDS_QM_HELP_PICTURE_NUMBERS"));
     sub->add_option("--scale", o->scale, Say("IDS_QM_HELP_PICTURE_SCALE"))
-        ->check(CLI::Range(1e-9, 1e9));
+        ->check(FiniteRange(1e-9, 1e9));
     sub->add_option("--size", o->size, Say("IDS_QM_HELP_PICTURE_SIZE"))
-        ->check(CLI::Range(0.1, 10.0));
+        ->check(FiniteRange(0.1, 10.0));
     sub->add_option("-o", o->out, Say("IDS_QM_HELP_PICTURE_OUT"))->required();
     AddExample(sub, "picture examples/rc-frame-code-hinges/case.json --case G --what My -o my.svg");
     sub->callback([o, &code] { code = RunPicture(*o); });

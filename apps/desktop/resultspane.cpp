@@ -146,10 +146,8 @@ T_RESULT_TABLE_CHOICE CResultsPane::Choice() const
     if (!choice.envelope) {
         choice.sources.emplace_back(shown.Source(), shown.Step());
     } else {
-        for (const T_SHAPE_SOURCE& source : shown.Sources())
-            if (source.analysed && (source.kind == T_SHAPE_SOURCE::KIND::Static ||
-                                    source.kind == T_SHAPE_SOURCE::KIND::Combination))
-                choice.sources.emplace_back(source, 1);
+        for (const T_SHAPE_SOURCE& source : EnvelopeSources(shown.Sources()))
+            choice.sources.emplace_back(source, 1);
     }
     if (m_chosen->isChecked()) {
         choice.elements = m_frame.Selection().Chosen(EXPLORER_TABLE::Elements);
@@ -168,10 +166,10 @@ void CResultsPane::Refresh()
         why = Say("IDS_QM_VIEW_NOT_ANALYSED");
     else
         (void)MakeResultTable(m_frame.Doc(), m_scene, choice, m_table, why);
-    m_note->setText(QString::fromStdString(
-        !why.empty()      ? why
-        : choice.envelope ? Say("IDS_QM_VIEW_TABLE_OVER", std::to_string(choice.sources.size()))
-                          : m_frame.Shown().Subtitle()));
+    std::string note = !why.empty() ? why : choice.envelope ? "" : m_frame.Shown().Subtitle();
+    for (const std::string& text : m_table.notes)
+        note += (note.empty() ? "" : "; ") + text;
+    m_note->setText(QString::fromStdString(note));
     m_model->Reset();
     m_view->resizeColumnsToContents();
 }

@@ -1,6 +1,8 @@
 // Pictures and tables of results through the program.
 #include "program.h"
 
+#include <algorithm>
+
 namespace {
 
 class ViewCommands : public CProgramTest {};
@@ -19,7 +21,8 @@ TEST_F(ViewCommands, ReactionsCarryTheLoads)
     }
     EXPECT_NEAR(4 * 32.6 * 4.6, up, 1e-6); // on the flexible lengths of four beams
     EXPECT_NEAR(-300.0, along, 1e-6);
-    Done("results @rc-frame-code-hinges --envelope --csv e.csv --xlsx e.xlsx");
+    ExpectHolds(Done("results @rc-frame-code-hinges --envelope --csv e.csv --xlsx e.xlsx"),
+                {"load cases and combinations\n"});
     ExpectHolds(Text("e.csv"), {"Element,Position,Component,Unit,Smallest,in,Largest,in\n",
                                 "\n11,member,My,kN*m,"});
     EXPECT_EQ("PK", Text("e.xlsx").substr(0, 2));
@@ -36,5 +39,30 @@ TEST_F(ViewCommands, PicturesSayWhatTheyShowAndWhatIsNotThere)
     ExpectRefused("picture @rc-frame-code-hinges --mode 1 --what My -o no.svg", 1, "no forces");
     ExpectRefused("picture @rc-frame-code-hinges --case none -o no.svg", 2, "none");
     ExpectRefused("results @rc-frame-code-hinges --case G --elements 999", 2, "999");
+    EXPECT_FALSE(std::filesystem::exists(m_folder / "no.svg"));
+}
+
+TEST_F(ViewCommands, AnEnvelopeHasTheCombinationsAndFiltersHaveAnEffect)
+{
+    // Upward loads alone, with the weight turned: their sum lifts most.
+    Write("up.json",
+          With(ReadText(ExampleCase("tuned-beam")), R"("W", "factor": 1)", R"("W", "factor": -1)"));
+    Done("results up.json --envelope --what displacements --csv up.csv");
+    const auto lines = Lines(Text("up.csv"));
+    EXPECT_EQ(4, std::ranges::count_if(lines, [](const std::string& line) {
+                  return line.find(",DZ,m,") == 1 && line.ends_with(",ALL");
+              }));
+    ExpectHolds(Done("results up.json --envelope"),
+                {"Envelope over 6 load cases and combinations\n"});
+    const json modes = Json("results @space-frame-3d --mode 1 --what displacements");
+    EXPECT_EQ("DX (-)", modes.at("columns").at(2));
+    EXPECT_EQ("RZ (rad/m)", modes.at("columns").at(7));
+    ExpectRefused("results @rc-frame-code-hinges --case G --nodes 1", 2, "--nodes");
+    ExpectRefused("results @rc-frame-code-hinges --what reactions --elements 1", 2, "--elements");
+    ExpectRefused("results @rc-frame-code-hinges --what displacements --case G --mode 1", 1,
+                  "mode");
+    for (const char* option : {"--scale nan", "--size nan", "--scale inf", "--size -nan"})
+        ExpectRefused("picture @rc-frame-code-hinges --case G -o no.svg " + std::string(option), 2,
+                      "no number");
     EXPECT_FALSE(std::filesystem::exists(m_folder / "no.svg"));
 }

@@ -1,4 +1,5 @@
 // The arguments of the judgement.
+#include "finiterange.h"
 #include "judge/judgecommand.h"
 #include "registershared.h"
 #include "registrations.h"
@@ -16,7 +17,7 @@ void AddJudge(CLI::App& app, EXIT_CODE& code)
         ->needs(by);
     sub->add_option("--limit-state", o->level, Say("IDS_QM_HELP_JUDGE_LEVEL"))
         ->check(CLI::IsMember(JudgedLevelNames()));
-    const CLI::Range factor(1.0, 10.0);
+    const CLI::Validator factor = FiniteRange(1.0, 10.0);
     sub->add_option("--gamma-c", o->factors.gammaC, Say("IDS_QM_HELP_JUDGE_GAMMA_C"))
         ->check(factor)
         ->capture_default_str();

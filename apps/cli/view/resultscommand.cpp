@@ -18,6 +18,7 @@ std::string JsonOf(const T_RESULT_TABLE& table)
 {
     CJsonText w(JSON_REALS::Shortest);
     w.Object();
+    if (!table.notes.empty()) w.Items("notes", table.notes, kJsonOneLine);
     w.Items("columns", table.heads, kJsonOneLine);
     w.Key("rows").List();
     for (const auto& row : table.rows) {
@@ -61,6 +62,16 @@ EXIT_CODE ReadNodeIds(CDBDoc& doc, const T_RESULTS_OPTIONS& o, std::set<int>& ou
     return EXIT_CODE::Done;
 }
 
+/// Nodes are those of displacements and reactions, elements those of forces: what would have no
+/// effect is refused.
+EXIT_CODE CheckFilters(const T_RESULTS_OPTIONS& o, RESULT_TABLE what)
+{
+    const bool forces = what == RESULT_TABLE::Forces;
+    if ((forces ? o.nodes : o.elements).empty()) return EXIT_CODE::Done;
+    return Complain(EXIT_CODE::Usage, Say("IDS_QM_VIEW_NO_EFFECT",
+                                          forces ? "--nodes" : "--elements", "--what " + o.what));
+}
+
 EXIT_CODE WriteTable(const T_RESULTS_OPTIONS& o, const T_RESULT_TABLE& table)
 {
     EXIT_CODE code = EXIT_CODE::Done;
@@ -70,6 +81,8 @@ EXIT_CODE WriteTable(const T_RESULTS_OPTIONS& o, const T_RESULT_TABLE& table)
     if (code == EXIT_CODE::Done && !o.xlsx.empty() && !WriteSheet(o.xlsx, SheetOf(table), error))
         code = ReportFileError(error);
     if (code != EXIT_CODE::Done || o.csv == "-" || o.json == "-") return code;
+    for (const std::string& note : table.notes)
+        std::printf("%s\n", note.c_str());
     for (const std::string* file : {&o.csv, &o.json, &o.xlsx})
         if (!file->empty())
             std::printf("%s: %s\n", file->c_str(),
@@ -89,14 +102,15 @@ EXIT_CODE RunResults(const T_RESULTS_OPTIONS& o)
             o.overwrite);
         code != EXIT_CODE::Done)
         return code;
-    CDBDoc doc;
-    if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
-    CFrameScene scene(doc);
     T_RESULT_TABLE_CHOICE choice;
     choice.envelope = o.envelope;
     choice.what = static_cast<RESULT_TABLE>(
         std::ranges::find_if(kResultTableNames, [&](const char* n) { return o.what == n; }) -
         kResultTableNames.begin());
+    if (const EXIT_CODE code = CheckFilters(o, choice.what); code != EXIT_CODE::Done) return code;
+    CDBDoc doc;
+    if (const EXIT_CODE code = OpenInput(doc, o.file); code != EXIT_CODE::Done) return code;
+    CFrameScene scene(doc);
     if (const EXIT_CODE code = ReadElementIds(doc, o, choice.elements); code != EXIT_CODE::Done)
         return code;
     if (const EXIT_CODE code = ReadNodeIds(doc, o, choice.nodes); code != EXIT_CODE::Done)

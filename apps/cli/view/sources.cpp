@@ -5,6 +5,7 @@
 #include "push/pushfirst.h"
 #include "qm_base/say.h"
 #include "qm_rps/desk/elementlist.h"
+#include "qm_rps/view/resulttable.h"
 
 #include <algorithm>
 
@@ -91,7 +92,9 @@ EXIT_CODE FindSources(CDBDoc& doc, const T_SOURCE_OPTIONS& o, CFrameScene& scene
         if (code == EXIT_CODE::Done)
             code = add([mode](const auto& s) { return s.kind == KIND::Mode && s.key == mode; },
                        "IDS_QM_CLI_NO_MODE", std::to_string(mode));
-    if (AsksForNothing(o))
+    if (AsksForNothing(o) && o.envelope)
+        out = EnvelopeSources(all);
+    else if (AsksForNothing(o))
         std::ranges::copy_if(all, std::back_inserter(out),
                              [](const auto& s) { return s.kind == KIND::Static; });
     return code;

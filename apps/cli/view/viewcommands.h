@@ -14,7 +14,7 @@ struct T_SOURCE_OPTIONS {
     std::vector<int> modes;
     int step = 0;         // of stages and pushes; 0: the last one
     std::string elements; // "1,5-9": shown alone; empty: all
-    bool overwrite = false;
+    bool overwrite = false, envelope = false;
 };
 
 struct T_PICTURE_OPTIONS : T_SOURCE_OPTIONS {
@@ -25,14 +25,14 @@ struct T_PICTURE_OPTIONS : T_SOURCE_OPTIONS {
 
 struct T_RESULTS_OPTIONS : T_SOURCE_OPTIONS {
     std::string what = "forces", nodes, csv, xlsx, json;
-    bool envelope = false;
 };
 
 /// Analyses, or pushes, what has no results yet, and draws or lists it. The file stays as it is.
 EXIT_CODE RunPicture(const T_PICTURE_OPTIONS& options);
 EXIT_CODE RunResults(const T_RESULTS_OPTIONS& options);
 
-/// The sources that are asked for, analysed; no names: every load case. Done, or the code to exit
+/// The sources that are asked for, analysed; no names: every load case, for an envelope
+/// combinations, too. Done, or the code to exit
 /// with after one line on stderr.
 EXIT_CODE FindSources(CDBDoc& doc, const T_SOURCE_OPTIONS& options, CFrameScene& scene,
                       std::vector<T_SHAPE_SOURCE>& out);

@@ -24,6 +24,14 @@ constexpr std::array<T_COMPONENTS, 3> kComponents{{{kMoves, kDimLength, kDimNone
                                                    {kReactions, kDimForce, kDimMoment},
                                                    {kMemberForceNames, kDimForce, kDimMoment}}};
 
+using KIND = T_SHAPE_SOURCE::KIND;
+using T_AT_STEP = std::pair<T_SHAPE_SOURCE, int>;
+
+bool IsCase(const T_SHAPE_SOURCE& source)
+{
+    return source.kind == KIND::Static || source.kind == KIND::Combination;
+}
+
 T_RESULT_CELL Number(double value)
 {
     return {{}, value};
@@ -111,6 +119,7 @@ public:
 
     int Read(std::string& why)
     {
+        if (!JudgeModes(why)) return 0;
         if (m_choice.what == RESULT_TABLE::Forces && !m_frame.Refresh(why)) return 0;
         for (std::size_t s = 0; s < m_choice.sources.size(); ++s)
             if (!ReadSource(s, why)) return 0;
@@ -120,6 +129,7 @@ public:
 
     void Write(T_RESULT_TABLE& out) const
     {
+        out.notes = Notes();
         out.title =
             Say("IDS_QM_VIEW_TABLE", kResultTableNames[static_cast<std::size_t>(m_choice.what)]);
         m_choice.envelope ? WriteEnvelope(out) : WriteRows(out);
@@ -130,6 +140,26 @@ private:
     const std::string& NameOf(std::size_t source) const
     {
         return m_choice.sources[source].first.name;
+    }
+
+    /// Shapes of modes have no unit of length: they share no column with displacements.
+    int JudgeModes(std::string& why)
+    {
+        const auto modes = std::ranges::count_if(
+            m_choice.sources, [](const auto& s) { return s.first.kind == KIND::Mode; });
+        m_shape = modes > 0;
+        if (modes == 0 || static_cast<std::size_t>(modes) == m_choice.sources.size()) return 1;
+        why = Say("IDS_QM_VIEW_MODES_APART");
+        return 0;
+    }
+
+    std::vector<std::string> Notes() const
+    {
+        std::vector<std::string> notes;
+        if (m_choice.envelope && std::ranges::all_of(m_choice.sources, IsCase, &T_AT_STEP::first))
+            notes.push_back(Say("IDS_QM_VIEW_TABLE_OVER", std::to_string(m_choice.sources.size())));
+        if (m_shape) notes.push_back(Say("IDS_QM_VIEW_MODE_SCALE"));
+        return notes;
     }
 
     /// What is far below the largest of its kind is 0.
@@ -242,9 +272,16 @@ private:
             }
     }
 
+    T_DIM Dim(std::size_t c) const { return c < 3 ? m_components.linear : m_components.angular; }
+    /// A mode keeps its own normalisation, that of lengths in m.
+    std::string Unit(std::size_t c) const
+    {
+        if (m_shape) return c < 3 ? "-" : "rad/m";
+        return UnitOf(Dim(c), m_units);
+    }
     double Shown(const T_DOF6& values, std::size_t c) const
     {
-        return FromSi(values[c], m_units, c < 3 ? m_components.linear : m_components.angular) + 0.0;
+        return (m_shape ? values[c] : FromSi(values[c], m_units, Dim(c))) + 0.0;
     }
 
     void WriteRows(T_RESULT_TABLE& out) const
@@ -253,9 +290,7 @@ private:
                      Say(HasForces() ? "IDS_QM_VIEW_HEAD_ELEMENT" : "IDS_QM_VIEW_HEAD_NODE")};
         if (HasForces()) out.heads.push_back(Say("IDS_QM_VIEW_HEAD_POSITION"));
         for (std::size_t c = 0; c < 6; ++c)
-            out.heads.push_back(
-                std::string(m_components.names[c]) + " (" +
-                UnitOf(c < 3 ? m_components.linear : m_components.angular, m_units) + ")");
+            out.heads.push_back(std::string(m_components.names[c]) + " (" + Unit(c) + ")");
         for (const T_LINE_VALUES& line : m_lines) {
             auto& row = out.rows.emplace_back();
             row.push_back({NameOf(line.source)});
@@ -305,7 +340,7 @@ private:
         row.push_back(Number(place.first));
         if (HasForces()) row.push_back({place.second});
         row.push_back({m_components.names[c]});
-        row.push_back({UnitOf(c < 3 ? m_components.linear : m_components.angular, m_units)});
+        row.push_back({Unit(c)});
         row.push_back(Number(least(low)));
         row.push_back({NameOf(low->source)});
         row.push_back(Number(most(high)));
@@ -319,6 +354,7 @@ private:
     T_UNITS m_units;
     const T_COMPONENTS& m_components;
     std::vector<T_LINE_VALUES> m_lines;
+    bool m_shape = false; // of modes
 };
 
 std::string TextOf(const T_RESULT_CELL& cell)
@@ -327,6 +363,14 @@ std::string TextOf(const T_RESULT_CELL& cell)
 }
 
 } // namespace
+
+std::vector<T_SHAPE_SOURCE> EnvelopeSources(const std::vector<T_SHAPE_SOURCE>& all)
+{
+    std::vector<T_SHAPE_SOURCE> out;
+    std::ranges::copy_if(all, std::back_inserter(out),
+                         [](const auto& source) { return source.analysed && IsCase(source); });
+    return out;
+}
 
 int MakeResultTable(CDBDoc& doc, CFrameScene& scene, const T_RESULT_TABLE_CHOICE& choice,
                     T_RESULT_TABLE& out, std::string& why)
