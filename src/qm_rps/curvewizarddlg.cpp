@@ -28,12 +28,12 @@ std::vector<T_CURVE_METHOD> AllMethods()
     return all;
 }
 
-/// A list that was typed. 0: a part of it is no number.
+/// A list that was typed. 0: it can't be read.
 int ReadList(const std::string& text, const char* field, std::vector<double>& out, T_FINDING& fault)
 {
-    std::string bad;
-    const auto list = ParseNumberList(text, bad);
-    if (!list) return CreateFault(fault, field, "IDS_QM_NEW_LIST", bad);
+    std::string why;
+    const auto list = ParseNumberList(text, why);
+    if (!list) return CreateFault(fault, field, "IDS_QM_NEW_TEXT", why);
     out = *list;
     return 1;
 }

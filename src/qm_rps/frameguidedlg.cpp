@@ -3,6 +3,7 @@
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
 #include "qm_db/editscope.h"
+#include "qm_rps/create/buildingparts.h"
 #include "qm_rps/create/createfault.h"
 #include "qm_rps/create/numberlist.h"
 #include "qm_rps/push/casegenerator.h"
@@ -66,9 +67,9 @@ int CFrameGuideDlg::ReadLists(T_BUILDING& out, T_FINDING& fault) const
         {"baysY", m_baysY, in.baysY},
         {"storeys", m_storeys, in.storeys}};
     for (const auto& [field, text, list] : lists) {
-        std::string bad;
-        const auto read = ParseNumberList(text, bad);
-        if (!read) return CreateFault(fault, field, "IDS_QM_NEW_LIST", bad);
+        std::string why;
+        const auto read = ParseNumberList(text, why);
+        if (!read) return CreateFault(fault, field, "IDS_QM_NEW_TEXT", why);
         list = *read;
     }
     in.braceBays = WordsOf(m_braceBays);
@@ -107,7 +108,9 @@ std::string CFrameGuideDlg::NotesText()
     std::string text =
         Say("IDS_QM_NEW_FRAME_IS", m_facts.plan, std::to_string(m_asked.storeys.size()),
             std::to_string(m_facts.nodes), std::to_string(m_facts.elements));
-    return text + "\n" + Say("IDS_QM_NEW_FRAME_MASS", ShortestText(m_asked.liveInMass));
+    text += "\n" + Say("IDS_QM_NEW_FRAME_MASS", ShortestText(m_asked.liveInMass));
+    if (const std::string doubt = BuildingDoubt(m_asked); !doubt.empty()) text += "\n" + doubt;
+    return text;
 }
 
 std::string CFrameGuideDlg::CommandText()
@@ -188,6 +191,8 @@ int CFrameGuideDlg::MakePushCases()
     std::string error;
     CEditScope edit(m_doc, Say("IDS_QM_NEW_FRAME_TITLE"));
     bool done = GenerateCases(m_doc, choice, cases, basis, error) != 0;
+    m_pushText = done ? ModeBasisText(basis) : "";
+    m_hasLowMass = done && HasLowMass(basis);
     for (const T_POLC_D& record : cases)
         done = done && edit.Put(NextKey(m_doc.Data().Model().pushovers), record);
     if (done && edit.Commit()) return 1;
@@ -200,8 +205,16 @@ int CFrameGuideDlg::OnOK()
     if (!CheckData() || (m_mayReplace && !m_mayReplace())) return 0;
     m_doc.NewModel();
     m_doc.Data().Assign(m_content);
-    if (m_modes > 0) (void)FindModes();
-    if (m_push) (void)MakePushCases();
+    m_pushText.clear();
+    m_hasLowMass = false;
+    m_isWhole = m_modes == 0 || FindModes();
+    m_isWhole = (!m_push || MakePushCases()) && m_isWhole;
+    const T_TABLE<T_EIGV_D>& modes = m_doc.Data().Model().modes;
+    const bool isOdd = !modes.empty() && !IsUsualPeriod(modes.begin()->second.period);
+    if (isOdd)
+        ShowMessage("IDS_QM_NEW_ODD_PERIOD",
+                    Say("IDS_QM_NEW_ODD_PERIOD", FormatText("%.4g", modes.begin()->second.period)));
+    if (m_hasLowMass) ShowMessage("IDS_QM_PUSH_GEN_LOW_MASS", m_pushText);
     m_doc.Data().SetModified(true);
     return 1;
 }

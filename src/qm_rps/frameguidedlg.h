@@ -37,6 +37,11 @@ public:
     std::vector<T_FINDING> Findings() const override;
     const T_BUILDING_FACTS& Facts() const { return m_facts; }
 
+    /// After OnOK: the modes that the pushover load cases take; empty: there are none.
+    const std::string& PushText() const { return m_pushText; }
+    /// After OnOK: whether all modes and load cases that were wanted are there.
+    bool IsWhole() const { return m_isWhole; }
+
     /// Asked before the open model goes; 0: it stays. Set by the application.
     std::function<int()> m_mayReplace;
     /// Runs work that tells parts done of a total and stops where that asks it to (false); set by
@@ -45,7 +50,8 @@ public:
     std::function<int(const std::function<int(TELL_FN)>&)> m_withProgress;
     /// Puts the frame into the document in place of what it has, finds its modes and makes its load
     /// cases. 0: refused with a message; where modes or load cases can't be had, the frame stays
-    /// and a message says why.
+    /// and a message says why. Messages also tell of an unusual period, and of a mode of the load
+    /// cases that moves less than half of the mass.
     int OnOK() override;
 
 private:
@@ -55,6 +61,8 @@ private:
     int MakePushCases();
 
     CDBDoc& m_doc;
+    std::string m_pushText;
+    bool m_isWhole = false, m_hasLowMass = false;
     std::unique_ptr<CDBDoc> m_preview;
     CFrameScene m_scene;
     mutable bool m_isTried = false, m_isMade = false;

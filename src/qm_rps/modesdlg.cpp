@@ -64,9 +64,9 @@ int CModesDlg::PutModes(const std::vector<T_EIGV_D>& modes)
 
 int CModesDlg::OnAdd()
 {
-    std::string bad;
-    const auto shape = ParseNumberList(m_shape, bad);
-    if (!shape) return Refuse("IDS_QM_NEW_LIST", Say("IDS_QM_NEW_LIST", bad));
+    std::string why;
+    const auto shape = ParseNumberList(m_shape, why);
+    if (!shape) return Refuse("IDS_QM_NEW_LIST", why);
     T_EIGV_D mode;
     T_FINDING fault;
     if (!MakeTypedMode(m_doc.Data().Model(), {m_period, m_direction, *shape}, mode, fault))

@@ -14,17 +14,12 @@ std::string CPushOverCaseGeneratorDlg::BasisText() const
 {
     const std::string length(Doc() ? NameOf(Doc()->Unit().Units().length) : "");
     const auto number = [](double v) { return FormatText("%.6g", v); };
-    std::string text =
+    const std::string text =
         Say(m_isTargetGiven ? "IDS_QM_PUSH_GEN_BASIS" : "IDS_QM_PUSH_GEN_BASIS_HEIGHT",
             std::to_string(m_basis.controlNode), number(m_basis.target), length,
             number(m_basis.height));
-    for (std::size_t d = 0; d < m_basis.mode.size(); ++d)
-        if (m_basis.mode[d] != 0)
-            text += "\n" +
-                    Say(m_basis.ownModes ? "IDS_QM_PUSH_GEN_MODE" : "IDS_QM_PUSH_GEN_MODE_COMPUTED",
-                        d == 0 ? "X" : "Y", std::to_string(m_basis.mode[d]),
-                        FormatText("%.1f", m_basis.massPercent[d]));
-    return text;
+    const std::string modes = ModeBasisText(m_basis);
+    return modes.empty() ? text : text + "\n" + modes;
 }
 
 int CPushOverCaseGeneratorDlg::OnOK()

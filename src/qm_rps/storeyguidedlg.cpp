@@ -28,8 +28,9 @@ void CStoreyGuideDlg::OnTolerance(double tolerance)
 
 int CStoreyGuideDlg::Make(std::vector<T_STOR_D>& out, T_FINDING& fault) const
 {
-    if (!(m_tolerance >= 0.0 && std::isfinite(m_tolerance)))
-        return CreateFault(fault, "tolerance", "IDS_QM_NEW_NOT_NEGATIVE");
+    if (!std::isfinite(m_tolerance))
+        return CreateFault(fault, "tolerance", "IDS_QM_NEW_NOT_FINITE");
+    if (m_tolerance < 0.0) return CreateFault(fault, "tolerance", "IDS_QM_NEW_NOT_NEGATIVE");
     std::vector<std::string> names;
     for (std::size_t i = 0; i < m_levels.size(); ++i)
         if (m_taken[i] && !m_levels[i].isGround) names.push_back(m_names[i]);
@@ -100,8 +101,24 @@ std::string CStoreyGuideDlg::NotesText() const
     std::vector<T_STOR_D> storeys;
     T_FINDING fault;
     if (!Make(storeys, fault)) return fault.text;
+    const std::string doubt = DoubtText();
     return Say("IDS_QM_NEW_STOREYS_COME", std::to_string(storeys.size()),
-               std::to_string(m_doc.Data().Model().storeys.size()));
+               std::to_string(m_doc.Data().Model().storeys.size())) +
+           (doubt.empty() ? "" : "\n" + doubt);
+}
+
+std::string CStoreyGuideDlg::DoubtText() const
+{
+    constexpr double kMostSpread = 0.5; // m: more is no slope or step of one floor
+    std::string text;
+    for (std::size_t row = 0; row < m_levels.size(); ++row) {
+        const T_LEVEL_OF_NODES& level = m_levels[LevelOfRow(row)];
+        if (level.highest - level.lowest <= kMostSpread) continue;
+        text += (text.empty() ? "" : "\n") + Say("IDS_QM_NEW_WIDE_LEVEL", CellText(row, Elevation),
+                                                 CellText(row, Spread),
+                                                 std::string(NameOf(m_doc.Unit().Units().length)));
+    }
+    return text;
 }
 
 std::vector<T_FINDING> CStoreyGuideDlg::Findings() const

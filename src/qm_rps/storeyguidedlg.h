@@ -25,6 +25,8 @@ public:
     int SetCell(std::size_t row, COLUMN column, const std::string& text);
     /// How many storeys come, and how many there are now.
     std::string NotesText() const;
+    /// A line for each level whose nodes span more than 0.5 m: two floors may be one level.
+    std::string DoubtText() const;
 
     std::vector<T_FINDING> Findings() const override;
     /// Puts the storeys in place of all that the model has, as one edit that can be undone.

@@ -177,7 +177,7 @@ const std::string& CUlfTuningDlg::NameOf(std::size_t unknown) const
 
 int CUlfTuningDlg::OnFactor(std::size_t unknown, double factor)
 {
-    if (unknown >= m_factors.size() || !std::isfinite(factor)) return 0;
+    if (unknown >= m_factors.size() || !(std::fabs(factor) <= kMostFactor)) return 0;
     m_factors[unknown] = factor;
     m_result->factors[m_unknowns[unknown]] = factor;
     return 1;

@@ -27,7 +27,9 @@ public:
     std::size_t Unknowns() const { return m_unknowns.size(); }
     const std::string& NameOf(std::size_t unknown) const;
     double Factor(std::size_t unknown) const { return m_factors.at(unknown); }
-    /// 1 taken; 0 not finite, or there is no such unknown.
+    /// More scales no load of a bridge: forces of such a factor lose their digits.
+    static constexpr double kMostFactor = 1e6;
+    /// 1 taken; 0 not finite, beyond kMostFactor, or there is no such unknown.
     [[nodiscard]] int OnFactor(std::size_t unknown, double factor);
     int m_chosen = 0; // the unknown that the slider moves
     /// Positions 0 to kSlider of the slider, over as much as the factor's size on either side.

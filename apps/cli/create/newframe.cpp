@@ -52,7 +52,6 @@ EXIT_CODE Take(const T_NEW_FRAME_OPTIONS& o, CFrameGuideDlg& dialog)
         return Refuse(Say("IDS_QM_CLI_NEW_UNITS", o.units, UnitWords()));
     for (std::string* const grade : {&b.columnGrade, &b.beamGrade})
         if (grade->empty()) *grade = o.grade;
-    if (b.braceGrade.empty()) b.braceGrade = preset.braceGrade;
     b.deadRoof = o.deadRoof.value_or(b.dead);
     b.liveRoof = o.liveRoof.value_or(b.live);
     b.hasDiaphragms = !o.noDiaphragms;
@@ -61,6 +60,9 @@ EXIT_CODE Take(const T_NEW_FRAME_OPTIONS& o, CFrameGuideDlg& dialog)
                                         : BUILDING_BRACES::None;
     if (!o.braces.empty() && b.braces == BUILDING_BRACES::None)
         return Refuse(Say("IDS_QM_CLI_NEW_WORD", "--braces", o.braces));
+    if (o.braces.empty() && !(o.braceBays + b.braceSection + b.braceGrade).empty())
+        return Refuse(Say("IDS_QM_CLI_NEW_NO_BRACES"));
+    if (b.braceGrade.empty()) b.braceGrade = preset.braceGrade;
     b.loaded = o.loaded == "x"   ? LOADED_BEAMS::AlongX
                : o.loaded == "y" ? LOADED_BEAMS::AlongY
                                  : LOADED_BEAMS::All;
@@ -90,6 +92,7 @@ void Print(CFrameGuideDlg& dialog, CDBDoc& doc)
                                 .c_str());
     for (const auto& [key, record] : doc.Data().Model().pushovers)
         std::printf("%s\n", Say("IDS_QM_CLI_NEW_PUSH", record.name).c_str());
+    if (!dialog.PushText().empty()) std::printf("%s\n", dialog.PushText().c_str());
 }
 
 } // namespace
@@ -106,9 +109,11 @@ EXIT_CODE RunNewFrame(const T_NEW_FRAME_OPTIONS& o)
     if (const auto findings = dialog.Findings(); !findings.empty())
         return Refuse(OptionOf(findings.front().field) + findings.front().text);
     // Modes or load cases that can't be had are no frame that was asked for: nothing is written.
-    if (!dialog.OnOK() || !dialog.Messages().empty()) return Refuse(dialog.Messages().back().text);
+    if (!dialog.OnOK() || !dialog.IsWhole()) return Refuse(dialog.Messages().back().text);
     if (const EXIT_CODE code = SaveDocument(doc, o.out); code != EXIT_CODE::Done) return code;
     Print(dialog, doc);
+    for (const auto& message : dialog.Messages())
+        std::fprintf(stderr, "%s\n", message.text.c_str());
     std::printf("%s\n", Say("IDS_QM_CLI_NEW_NEXT", "analyse " + o.out).c_str());
     return EXIT_CODE::Done;
 }

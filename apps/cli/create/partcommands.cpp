@@ -67,6 +67,8 @@ EXIT_CODE RunStoreys(const T_STOREYS_OPTIONS& o)
                         unit, ElementListText(storey.nodes))
                         .c_str());
     }
+    if (const std::string doubt = dialog.DoubtText(); !doubt.empty())
+        std::fprintf(stderr, "%s\n", doubt.c_str());
     return o.out.empty() ? EXIT_CODE::Done : SaveDocument(doc, o.out);
 }
 
@@ -91,6 +93,8 @@ EXIT_CODE RunSpectrum(const T_SPECTRUM_OPTIONS& o)
         rows.insert(rows.end(), values.rows.begin(), values.rows.end());
         std::printf("%s: %s\n%s", record.name.c_str(), SpectrumText(record).c_str(),
                     TableText(rows).c_str());
+        if (const std::string doubt = SpectrumDoubt(record); !doubt.empty())
+            std::fprintf(stderr, "%s: %s\n", record.name.c_str(), doubt.c_str());
     }
     return EXIT_CODE::Done;
 }

@@ -5,6 +5,7 @@
 #include "output.h"
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/factors/tuning/unknownname.h"
 #include "qm_rps/section/sectionexport.h"
 #include "qm_rps/ulftuningdlg.h"
 
@@ -26,30 +27,41 @@ std::string TextOf(const T_TEXT_TABLE& table)
     return TableText(rows);
 }
 
-/// "T101=1.2": the whole name of an unknown, or of its load case alone.
-bool TakeFactor(CUlfTuningDlg& tuned, const std::string& text)
+std::string ListOf(const std::vector<std::string>& names)
 {
+    std::string text;
+    for (const std::string& name : names)
+        text += (text.empty() ? "" : ", ") + name;
+    return text;
+}
+
+/// "T101=1.2": the whole name of an unknown, or of its load case alone. Empty: taken; else why not.
+std::string TakeFactor(CUlfTuningDlg& tuned, const std::string& text)
+{
+    std::vector<std::string> names;
+    for (std::size_t u = 0; u < tuned.Unknowns(); ++u)
+        names.push_back(tuned.NameOf(u));
     const std::size_t at = text.rfind('=');
     const std::optional<double> factor =
         at == std::string::npos ? std::nullopt : ParseFinite(text.substr(at + 1));
-    if (!factor) return false;
-    const std::string name = text.substr(0, at);
-    for (std::size_t u = 0; u < tuned.Unknowns(); ++u) {
-        const std::string& whole = tuned.NameOf(u);
-        if (whole == name || whole.ends_with(" " + name)) return tuned.OnFactor(u, *factor) != 0;
+    const auto fits =
+        factor ? UnknownsNamed(names, text.substr(0, at)) : std::vector<std::size_t>();
+    if (fits.empty()) return Say("IDS_QM_CLI_TUNE_BAD_FACTOR", text, ListOf(names));
+    if (fits.size() > 1) {
+        std::vector<std::string> several;
+        for (const std::size_t u : fits)
+            several.push_back(names[u]);
+        return Say("IDS_QM_CLI_TUNE_SEVERAL", text, ListOf(several));
     }
-    return false;
+    if (tuned.OnFactor(fits.front(), *factor)) return {};
+    return Say("IDS_QM_CLI_TUNE_LARGE", text, ShortestText(CUlfTuningDlg::kMostFactor));
 }
 
 EXIT_CODE Take(CUlfTuningDlg& tuned, const T_TUNE_OPTIONS& o)
 {
-    std::string names;
-    for (std::size_t u = 0; u < tuned.Unknowns(); ++u)
-        names += (names.empty() ? "" : ", ") + tuned.NameOf(u);
     for (const std::string& factor : o.factors)
-        if (!TakeFactor(tuned, factor))
-            return Complain(EXIT_CODE::Usage,
-                            o.file + ": " + Say("IDS_QM_CLI_TUNE_BAD_FACTOR", factor, names));
+        if (const std::string why = TakeFactor(tuned, factor); !why.empty())
+            return Complain(EXIT_CODE::Usage, o.file + ": " + why);
     return EXIT_CODE::Done;
 }
 

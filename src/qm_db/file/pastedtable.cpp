@@ -4,6 +4,7 @@
 #include "qm_db/file/recorderform.h"
 
 #include <algorithm>
+#include <span>
 
 namespace {
 
@@ -73,6 +74,35 @@ int ReadRow(const T_RECORDER_LINE& row, const T_RECORDER_FORM& form, T_PASTED_TA
     return 1;
 }
 
+/// "1,500": what is written alike with three decimals and with a separator of thousands.
+bool MayPartThousands(std::string_view cell)
+{
+    constexpr std::size_t kGroup = 3;
+    if (cell.starts_with('-') || cell.starts_with('+')) cell.remove_prefix(1);
+    const std::size_t mark = cell.find_first_of(".,");
+    const auto isDigit = [](char c) { return c >= '0' && c <= '9'; };
+    return mark != cell.npos && mark >= 1 && mark <= kGroup && cell.front() != '0' &&
+           cell.size() == mark + 1 + kGroup && std::ranges::all_of(cell.substr(0, mark), isDigit) &&
+           std::ranges::all_of(cell.substr(mark + 1), isDigit);
+}
+
+/// The first cell with a mark where all that have one may part thousands; "": some number tells.
+std::string_view FindThousands(std::span<const T_RECORDER_LINE> rows, const T_RECORDER_FORM& form)
+{
+    std::string_view first;
+    std::vector<std::string_view> cells;
+    for (const T_RECORDER_LINE& row : rows) {
+        cells.clear();
+        SplitRecorderRow(row.text, form.separator, cells);
+        for (const std::string_view cell : cells) {
+            if (cell.find_first_of(".,") == cell.npos) continue;
+            if (!MayPartThousands(cell)) return {};
+            if (first.empty()) first = cell;
+        }
+    }
+    return first;
+}
+
 } // namespace
 
 int ReadPastedTable(std::string_view text, PASTED_DECIMAL decimal, T_PASTED_TABLE& out,
@@ -97,6 +127,9 @@ int ReadPastedTable(std::string_view text, PASTED_DECIMAL decimal, T_PASTED_TABL
     table.isDecimalComma = form->isDecimalComma;
     for (const T_RECORDER_LINE& row : rows)
         if (!ReadRow(row, *form, table, fault)) return 0;
+    if (decimal == PASTED_DECIMAL::Auto)
+        if (const auto cell = FindThousands(rows, *form); !cell.empty())
+            return Fail(fault, 0, Say("IDS_QM_NEW_TABLE_THOUSANDS", cell));
     out = std::move(table);
     return 1;
 }

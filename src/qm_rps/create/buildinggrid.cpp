@@ -4,6 +4,8 @@
 #include "qm_base/textformat.h"
 #include "qm_rps/create/createfault.h"
 
+#include <set>
+
 namespace {
 
 std::vector<double> PlacesOf(const std::vector<double>& widths, const T_UNITS& units)
@@ -37,6 +39,7 @@ int CBuildingGrid::ReadBays(const std::vector<std::string>& names, std::vector<T
     constexpr const char* kField = "braceBays";
     if (names.empty()) return CreateFault(fault, kField, "IDS_QM_NEW_NO_BAYS");
     std::vector<T_BRACED_BAY> bays;
+    std::set<std::pair<bool, std::size_t>> taken;
     for (const std::string& name : names) {
         const bool alongX = name.starts_with('x') || name.starts_with('X');
         const bool alongY = name.starts_with('y') || name.starts_with('Y');
@@ -47,6 +50,8 @@ int CBuildingGrid::ReadBays(const std::vector<std::string>& names, std::vector<T
                              *number == static_cast<double>(static_cast<std::size_t>(*number));
         if (!isThere) return CreateFault(fault, kField, "IDS_QM_NEW_NO_BAY", name);
         const auto i = static_cast<std::size_t>(*number);
+        if (!taken.emplace(alongX, i).second)
+            return CreateFault(fault, kField, "IDS_QM_NEW_BAY_TWICE", name);
         const std::size_t last = (alongX ? m_y.size() : m_x.size()) - 1;
         for (std::size_t line = 0; line <= last; line += last > 0 ? last : 1)
             bays.push_back(alongX ? T_BRACED_BAY{{i - 1, line}, {i, line}}

@@ -12,6 +12,7 @@
 namespace {
 
 constexpr std::size_t kMostLines = 200; // bays or storeys one way
+constexpr double kMostNodes = 2e5;      // more are no model that analyses take
 
 /// "0.4x0.6": width and height, in SI.
 std::optional<T_SECT_D> RectangleOf(const std::string& text, const T_UNITS& units)
@@ -48,6 +49,8 @@ int ReadBuildingPart(const std::string& field, const std::string& section, const
     const std::string gradeField = "grade." + field;
     if (!FillFromGrades(grade, false, part.material))
         return CreateFault(fault, gradeField.c_str(), "IDS_QM_NEW_NO_GRADE", grade);
+    if (!rectangle && part.material.type != MATL_CLASS::Steel)
+        return CreateFault(fault, gradeField.c_str(), "IDS_QM_NEW_STEEL_SHAPE", section, grade);
     part.density = part.material.density;
     part.material.density = 0.0; // weight stands in SELF, mass in the nodes
     part.material.name = grade + " (" + kBuildingCases[0] + ")";
@@ -70,9 +73,39 @@ int CheckBuilding(const T_BUILDING& in, T_FINDING& fault)
                                                      {"roofLive", in.liveRoof},
                                                      {"massLive", in.liveInMass}};
     for (const auto& [field, value] : values)
-        if (!(value >= 0.0 && std::isfinite(value)))
-            return CreateFault(fault, field, "IDS_QM_NEW_NOT_NEGATIVE");
+        if (!std::isfinite(value)) return CreateFault(fault, field, "IDS_QM_NEW_NOT_FINITE");
+    for (const auto& [field, value] : values)
+        if (value < 0.0) return CreateFault(fault, field, "IDS_QM_NEW_NOT_NEGATIVE");
+    if (in.liveInMass > 1.0)
+        return CreateFault(fault, "massLive", "IDS_QM_NEW_SHARE", ShortestText(in.liveInMass));
+    const double nodes = static_cast<double>(in.baysX.size() + 1) *
+                         static_cast<double>(in.baysY.size() + 1) *
+                         static_cast<double>(in.storeys.size() + 1);
+    if (nodes > kMostNodes)
+        return CreateFault(fault, "storeys", "IDS_QM_NEW_MANY_NODES", ShortestText(nodes),
+                           ShortestText(kMostNodes));
     if (in.baysY.empty() && in.loaded == LOADED_BEAMS::AlongY)
         return CreateFault(fault, "loaded", "IDS_QM_NEW_NO_Y_BEAMS");
     return 1;
+}
+
+std::string BuildingDoubt(const T_BUILDING& in)
+{
+    constexpr double kLeastStorey = 1.5, kMostStorey = 20.0, kLeastBay = 0.5, kMostBay = 100.0; // m
+    const auto isOutside = [&in](const std::vector<double>& lengths, double least, double most) {
+        return std::ranges::any_of(lengths, [&](double value) {
+            const double metres = ToSi(value, in.units, kDimLength);
+            return metres < least || metres > most;
+        });
+    };
+    const bool isOdd = isOutside(in.storeys, kLeastStorey, kMostStorey) ||
+                       isOutside(in.baysX, kLeastBay, kMostBay) ||
+                       isOutside(in.baysY, kLeastBay, kMostBay);
+    return isOdd ? Say("IDS_QM_NEW_ODD_LENGTHS") : "";
+}
+
+bool IsUsualPeriod(double period)
+{
+    constexpr double kLeast = 0.02, kMost = 10.0; // s
+    return period >= kLeast && period <= kMost;
 }

@@ -19,3 +19,9 @@ struct T_BUILDING_PART {
 
 /// Lists of bays and storeys, loads and factor. 0: fault filled.
 [[nodiscard]] int CheckBuilding(const T_BUILDING& in, T_FINDING& fault);
+
+/// What no building has, in words for the user: a storey outside of 1.5 to 20 m, a bay outside of
+/// 0.5 to 100 m. Most likely the units are others. Empty: nothing.
+std::string BuildingDoubt(const T_BUILDING& in);
+/// 0.02 to 10 s.
+bool IsUsualPeriod(double period);

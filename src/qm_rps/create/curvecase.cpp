@@ -4,8 +4,11 @@
 #include "qm_base/textformat.h"
 #include "qm_db/attrctrl.h"
 #include "qm_db/recordfacts.h"
+#include "qm_rps/create/buildingparts.h"
 #include "qm_rps/create/createfault.h"
+#include "qm_rps/create/headerunits.h"
 #include "qm_rps/create/spectrumtext.h"
+#include "qm_rps/create/spectrumvalues.h"
 
 #include <algorithm>
 #include <array>
@@ -50,7 +53,9 @@ public:
 
     int Make(T_MODEL_CONTENT& out, T_CURVE_FACTS& facts)
     {
-        if (!ReadCurve(m_in.curve, m_facts.read, m_fault) || !TakeMasses() || !TakeShape())
+        if (!ReadCurve(m_in.curve, m_facts.read, m_fault) ||
+            !CheckHeaderUnits(m_facts.read, m_in.units, m_fault) || !TakeMasses() || !CheckTop() ||
+            !TakeShape())
             return 0;
         CalcFactors();
         MakeModel();
@@ -96,6 +101,21 @@ private:
         std::vector<double> shape = first.storeys;
         if (shape.size() + 1 == m_in.heights.size()) shape.push_back(first.displacement);
         return shape;
+    }
+
+    /// The control node is the top storey: a column of its own may differ by its rounding only.
+    int CheckTop()
+    {
+        constexpr double kRounding = 0.01;
+        for (const T_CURVE_POINT& point : m_facts.read.points) {
+            if (point.storeys.size() != m_in.heights.size()) continue;
+            const double d = point.displacement, top = point.storeys.back();
+            if (!(std::fabs(d - top) <= kRounding * std::max(std::fabs(d), std::fabs(top))))
+                return CreateFault(m_fault, "text", "IDS_QM_NEW_TOP_DIFFERS",
+                                   std::to_string(point.line), ShortestText(d), ShortestText(top),
+                                   std::to_string(point.storeys.size()));
+        }
+        return 1;
     }
 
     int TakeShape()
@@ -246,13 +266,11 @@ private:
 /// What no building has: wrong units, most likely.
 bool LooksOdd(const T_CURVE_CASE& in, const T_CURVE_FACTS& facts)
 {
-    constexpr double kLeastRatio = 0.005, kMostRatio = 3.0;   // base shear over weight
-    constexpr double kLeastPeriod = 0.02, kMostPeriod = 10.0; // s
-    constexpr double kMostDrift = 0.3;                        // displacement over height
+    constexpr double kLeastRatio = 0.005, kMostRatio = 3.0; // base shear over weight
+    constexpr double kMostDrift = 0.3;                      // displacement over height
     const double ratio = facts.peakForce / facts.weight;
     const double height = std::accumulate(in.heights.begin(), in.heights.end(), 0.0);
-    return !(ratio >= kLeastRatio && ratio <= kMostRatio) ||
-           !(facts.period >= kLeastPeriod && facts.period <= kMostPeriod) ||
+    return !(ratio >= kLeastRatio && ratio <= kMostRatio) || !IsUsualPeriod(facts.period) ||
            !(facts.read.points.back().displacement <= kMostDrift * height);
 }
 
@@ -307,6 +325,10 @@ std::vector<std::string> CurveCaseNotes(const T_CURVE_CASE& in, const T_CURVE_FA
     notes.push_back(
         Say("IDS_QM_NEW_PEAK", WithUnit(facts.peakForce, force), FormatText("%.4g", ratio)));
     if (LooksOdd(in, facts)) notes.push_back(Say("IDS_QM_NEW_ODD"));
+    constexpr double kLeastMassRatio = 0.5;
+    if (facts.massRatio < kLeastMassRatio) notes.push_back(Say("IDS_QM_NEW_ODD_SHAPE"));
+    if (const std::string doubt = SpectrumDoubt(in.spectrum); !doubt.empty())
+        notes.push_back(doubt);
     if (facts.read.storeys == 0 && in.heights.size() > 1)
         notes.push_back(Say("IDS_QM_NEW_NO_DRIFTS"));
     return notes;

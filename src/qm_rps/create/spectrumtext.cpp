@@ -148,7 +148,8 @@ void Read(CValues& in, T_SPFC_NTC& r)
     in.Letter("soil", r.soil);
     const std::string topography = in.Text("topography", kTopographies[0]);
     const auto* const at = std::ranges::find(kTopographies, topography);
-    r.topography = at == kTopographies.end() ? 0 : static_cast<int>(at - kTopographies.begin()) + 1;
+    if (at == kTopographies.end()) return in.Fail("IDS_QM_NEW_SPECTRUM_TOPOGRAPHY", topography);
+    r.topography = static_cast<int>(at - kTopographies.begin()) + 1;
     ReadDamping(in, r.damping);
     bool any = false;
     for (std::size_t i = 0; i < r.states.size(); ++i) {
@@ -294,8 +295,10 @@ int UserSpectrum(const std::string& text, T_SPFC_USER& out, T_FINDING& fault)
     constexpr const char* kTable = "table";
     T_PASTED_TABLE table;
     T_PASTED_FAULT why;
-    if (!ReadPastedTable(text, PASTED_DECIMAL::Auto, table, why))
+    if (!ReadPastedTable(text, PASTED_DECIMAL::Auto, table, why)) {
+        if (why.line == 0) return CreateFault(fault, kTable, "IDS_QM_NEW_TEXT", why.text);
         return CreateFault(fault, kTable, "IDS_QM_NEW_LINE", std::to_string(why.line), why.text);
+    }
     if (table.rows.front().cells.size() != 2)
         return CreateFault(fault, kTable, "IDS_QM_NEW_SPECTRUM_COLUMNS",
                            std::to_string(table.rows.front().cells.size()));

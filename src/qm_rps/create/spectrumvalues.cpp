@@ -4,6 +4,7 @@
 #include "qm_base/textformat.h"
 #include "qm_cmd/etc_design_spect.h"
 
+#include <algorithm>
 #include <cmath>
 #include <numbers>
 
@@ -150,4 +151,39 @@ T_TEXT_TABLE SpectrumValues(const T_SPFC_D& spectrum)
         table.rows.push_back(std::move(cells));
     }
     return table;
+}
+
+namespace {
+
+// No code maps as much: 3.5 stands for m/s2.
+constexpr double kMostAg = 1.5, kMostSa = 5.0; // g
+constexpr double kPlateauOfCa = 2.5;           // ATC-40 4.4.3
+
+bool IsOdd(const T_SPFC_ATC40& r)
+{
+    return kPlateauOfCa * r.Ca > kMostSa || r.Ca > kMostAg;
+}
+bool IsOdd(const T_SPFC_EURO2003& r)
+{
+    return r.ag > kMostAg;
+}
+bool IsOdd(const T_SPFC_EURO1996& r)
+{
+    return r.ag > kMostAg;
+}
+bool IsOdd(const T_SPFC_NTC& r)
+{
+    return std::ranges::any_of(r.states, [](const auto& s) { return s && s->ag > kMostAg; });
+}
+bool IsOdd(const T_SPFC_USER& r)
+{
+    return std::ranges::any_of(r.Sa, [](double Sa) { return Sa > kMostSa; });
+}
+
+} // namespace
+
+std::string SpectrumDoubt(const T_SPFC_D& spectrum)
+{
+    const bool isOdd = std::visit([](const auto& r) { return IsOdd(r); }, spectrum.data);
+    return isOdd ? Say("IDS_QM_NEW_ODD_SPECTRUM") : "";
 }

@@ -21,3 +21,7 @@ std::vector<T_SPECTRUM_CURVE> SpectrumCurves(const T_SPFC_D& spectrum, double gr
 
 /// Symbol, value, unit, meaning with its clause: a row each; a column of values for each curve.
 T_TEXT_TABLE SpectrumValues(const T_SPFC_D& spectrum);
+
+/// "! ag above 1.5 g, or an ordinate above 5 g": m/s2 were taken for g, most likely. Empty:
+/// neither.
+std::string SpectrumDoubt(const T_SPFC_D& spectrum);

@@ -1,6 +1,7 @@
 #include "qm_rps/push/casegenerator.h"
 
 #include "qm_base/say.h"
+#include "qm_base/textformat.h"
 #include "qm_db/recordfacts.h"
 #include "qm_rps/push/loadalgebra.h"
 #include "qm_rps/push/pushrun.h"
@@ -274,6 +275,37 @@ private:
 };
 
 } // namespace
+
+namespace {
+
+constexpr double kLowMass = 50.0; // per cent: most of the mass does not follow such a mode
+
+bool IsLow(const T_CASE_BASIS& basis, std::size_t direction)
+{
+    return basis.mode[direction] != 0 && basis.massPercent[direction] < kLowMass;
+}
+
+} // namespace
+
+std::string ModeBasisText(const T_CASE_BASIS& basis)
+{
+    std::string text;
+    for (std::size_t d = 0; d < basis.mode.size(); ++d) {
+        if (basis.mode[d] == 0) continue;
+        const std::string mode = std::to_string(basis.mode[d]);
+        const std::string percent = FormatText("%.1f", basis.massPercent[d]);
+        text += (text.empty() ? "" : "\n") +
+                Say(basis.ownModes ? "IDS_QM_PUSH_GEN_MODE" : "IDS_QM_PUSH_GEN_MODE_COMPUTED",
+                    kAxes[d], mode, percent);
+        if (IsLow(basis, d)) text += "\n" + Say("IDS_QM_PUSH_GEN_LOW_MASS", kAxes[d], mode);
+    }
+    return text;
+}
+
+bool HasLowMass(const T_CASE_BASIS& basis)
+{
+    return IsLow(basis, 0) || IsLow(basis, 1);
+}
 
 std::array<bool, 2> PushableDirections(const T_MODEL& model)
 {

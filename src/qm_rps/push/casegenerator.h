@@ -29,6 +29,11 @@ struct T_CASE_BASIS {
     bool ownModes = false;               // the model has modes; else they were computed here
 };
 
+/// The modes that the cases take, a line for each direction, and which move less than half of the
+/// mass; empty: none is taken.
+std::string ModeBasisText(const T_CASE_BASIS& basis);
+bool HasLowMass(const T_CASE_BASIS& basis);
+
 /// Directions in which the model can be pushed: it has masses there, and a node at the top moves.
 std::array<bool, 2> PushableDirections(const T_MODEL& model);
 

@@ -251,7 +251,7 @@ TEST(NewFrame, ASpaceFrameHasItsMembersAndLoads)
         {"baysX", [&] { dialog.m_baysX = "5,0"; }},
         {"columns", [&] { dialog.m_baysX = "5", dialog.m_building.columns = "HEB 201"; }},
         {"grade.beams",
-         [&] { dialog.m_building.columns = "HEB 200", dialog.m_building.beamGrade = "C26"; }},
+         [&] { dialog.m_building.columns = "0.4x0.4", dialog.m_building.beamGrade = "C26"; }},
         {"braceBays", [&] { dialog.m_building.beamGrade = "S355", dialog.m_braceBays = "x2"; }}};
     for (const auto& [field, spoil] : faults) {
         spoil();
