@@ -54,6 +54,10 @@ TEST_F(ViewCommands, AnEnvelopeHasTheCombinationsAndFiltersHaveAnEffect)
               }));
     ExpectHolds(Done("results up.json --envelope"),
                 {"Envelope over 6 load cases and combinations\n"});
+    // 3 rigid floors of 3 by 3 nodes, 12 beams each; the columns lie in none.
+    const char* const rigid = "36 members lie between nodes of one rigid diaphragm";
+    ExpectHolds(Done("results @space-frame-3d"), {rigid});
+    ExpectHolds(Done("picture @space-frame-3d --case G --what N -o n.svg"), {rigid});
     const json modes = Json("results @space-frame-3d --mode 1 --what displacements");
     EXPECT_EQ("DX (-)", modes.at("columns").at(2));
     EXPECT_EQ("RZ (rad/m)", modes.at("columns").at(7));

@@ -4,6 +4,7 @@
 
 #include "qm_base/say.h"
 #include "qm_base/textformat.h"
+#include "qm_rps/view/memberplaces.h"
 #include "qm_rps/view/resultview.h"
 
 #include <algorithm>
@@ -55,60 +56,6 @@ struct T_LINE_VALUES {
     bool whole = false;
 };
 
-struct T_STATION {
-    double x = 0.0, before = 0.0, behind = 0.0;
-    double rounding = 0.0; // what a difference must exceed
-    bool leaps = false;
-};
-
-/// 1 rises, -1 falls, 0 stays from a station to the next.
-int Way(const T_STATION& from, const T_STATION& to)
-{
-    const double rise = to.before - from.behind;
-    if (std::fabs(rise) <= to.rounding) return 0;
-    return rise > 0.0 ? 1 : -1;
-}
-
-/// A component along a member: between two stations it only rises or only falls.
-std::vector<T_STATION> StationsAlong(const CMemberLine& member, std::size_t c)
-{
-    constexpr double kRounding = 1e-9; // of the largest value
-    std::vector<T_STATION> out;
-    double largest = 0.0;
-    for (const double x : member.Stations(c, 1)) {
-        out.push_back({x, member.Force(c, x), member.Force(c, x, true)});
-        largest = std::max({largest, std::fabs(out.back().before), std::fabs(out.back().behind)});
-    }
-    for (T_STATION& at : out) {
-        at.rounding = kRounding * largest;
-        at.leaps = at.x < member.Length() && std::fabs(at.behind - at.before) > at.rounding;
-    }
-    return out;
-}
-
-/// Places that have rows beside the five positions: where My or Mz turns between these, and where
-/// any component leaps (true), at a position too: this one has one side alone.
-std::map<double, bool> PlacesBetween(const CMemberLine& member)
-{
-    constexpr double kAtPosition = 1e-5; // of a quarter
-    std::map<double, bool> out;
-    for (std::size_t c = 0; c < 6; ++c) {
-        const std::vector<T_STATION> along = StationsAlong(member, c);
-        for (std::size_t i = 0; i < along.size(); ++i) {
-            if (along[i].leaps) out[along[i].x] = true;
-            const double quarters = 4.0 * along[i].x / member.Length();
-            if (c < 4 || i == 0 || i + 1 == along.size() ||
-                std::fabs(quarters - std::round(quarters)) <= kAtPosition)
-                continue;
-            if (Way(along[i - 1], along[i]) == Way(along[i], along[i + 1])) continue;
-            const double reach = kAtPosition * member.Length();
-            const auto near = out.lower_bound(along[i].x - reach); // My and Mz may turn together
-            if (near == out.end() || near->first > along[i].x + reach) out[along[i].x] = false;
-        }
-    }
-    return out;
-}
-
 class CTableMaker {
 public:
     CTableMaker(CDBDoc& doc, CFrameScene& scene, const T_RESULT_TABLE_CHOICE& choice)
@@ -158,6 +105,7 @@ private:
         std::vector<std::string> notes;
         if (m_choice.envelope && std::ranges::all_of(m_choice.sources, IsCase, &T_AT_STEP::first))
             notes.push_back(Say("IDS_QM_VIEW_TABLE_OVER", std::to_string(m_choice.sources.size())));
+        if (m_rigid > 0) notes.push_back(RigidFloorNote(m_rigid));
         if (m_shape) notes.push_back(Say("IDS_QM_VIEW_MODE_SCALE"));
         return notes;
     }
@@ -215,6 +163,7 @@ private:
     {
         solver::T_LOAD_CASE loads;
         if (!m_frame.LoadsOf(m_choice.sources[index].first, step, loads, why)) return 0;
+        m_rigid = CountInDiaphragms(m_doc.Data().Model(), scene, m_choice.elements);
         const auto lineLoads = m_frame.LineLoads(loads);
         for (std::size_t l = 0; l < scene.lines.size(); ++l) {
             const T_SCENE_LINE& line = scene.lines[l];
@@ -354,7 +303,8 @@ private:
     T_UNITS m_units;
     const T_COMPONENTS& m_components;
     std::vector<T_LINE_VALUES> m_lines;
-    bool m_shape = false; // of modes
+    bool m_shape = false;    // of modes
+    std::size_t m_rigid = 0; // members in diaphragms
 };
 
 std::string TextOf(const T_RESULT_CELL& cell)

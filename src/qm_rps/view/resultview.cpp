@@ -268,7 +268,11 @@ std::vector<std::string> CResultView::Facts() const
         facts.push_back(DiagramFacts());
         if (m_choice.what == W::My || m_choice.what == W::Mz)
             facts.push_back(Say("IDS_QM_VIEW_TENSION_SIDE"));
-        if (m_choice.what == W::N) facts.push_back(Say("IDS_QM_VIEW_TENSION_POSITIVE"));
+        if (m_choice.what == W::N) {
+            facts.push_back(Say("IDS_QM_VIEW_TENSION_POSITIVE"));
+            const std::size_t rigid = CountInDiaphragms(m_doc.Data().Model(), *m_scene);
+            if (rigid > 0) facts.push_back(RigidFloorNote(rigid));
+        }
         if (m_diagram.notExact > 0)
             facts.push_back(Say("IDS_QM_VIEW_NOT_EXACT", std::to_string(m_diagram.notExact)));
     }

@@ -5,6 +5,7 @@
 #include "qm_base/say.h"
 
 #include <algorithm>
+#include <cmath>
 
 namespace {
 
@@ -170,4 +171,31 @@ T_VIEW_RESULTS ReadViewResults(CDBDoc& doc, const T_FRAME_SCENE& scene,
     if (wanted.forces) reader.ReadForces(out);
     if (wanted.reactions) reader.ReadReactions(out);
     return out;
+}
+
+std::size_t CountInDiaphragms(const T_MODEL& model, const T_FRAME_SCENE& scene,
+                              const std::set<int>& elements)
+{
+    constexpr double kFlat = 1e-6; // of the length of the line
+    std::set<std::size_t> found;
+    for (const auto& [key, diaphragm] : model.diaphragms) {
+        const std::set<int> nodes(diaphragm.nodes.begin(), diaphragm.nodes.end());
+        const auto normal = static_cast<std::size_t>(diaphragm.normal);
+        for (std::size_t l = 0; l < scene.lines.size(); ++l) {
+            const T_SCENE_LINE& line = scene.lines[l];
+            const int i = scene.nodes[line.i].id, j = scene.nodes[line.j].id;
+            if (line.kind == ELEM_KIND::Link || !nodes.contains(i) || !nodes.contains(j)) continue;
+            if (!elements.empty() && !elements.contains(line.id)) continue;
+            const auto &from = model.nodes.at(i).xyz, &to = model.nodes.at(j).xyz;
+            const double length = std::hypot(to[0] - from[0], to[1] - from[1], to[2] - from[2]);
+            if (length > 0.0 && std::fabs(to[normal] - from[normal]) <= kFlat * length)
+                found.insert(l);
+        }
+    }
+    return found.size();
+}
+
+std::string RigidFloorNote(std::size_t members)
+{
+    return Say("IDS_QM_VIEW_RIGID_FLOOR", std::to_string(members));
 }

@@ -30,3 +30,10 @@ struct T_VIEW_WANTED {
 
 /// Nodes that the ground holds: restrained by themselves (not by the model's plane) or by springs.
 [[nodiscard]] std::set<int> HeldNodes(const T_MODEL& model);
+
+/// Lines, of these elements (empty: all), that join two nodes of one rigid diaphragm in its plane:
+/// it keeps their ends apart, so that they have no axial force but that of loads on themselves.
+[[nodiscard]] std::size_t CountInDiaphragms(const T_MODEL& model, const T_FRAME_SCENE& scene,
+                                            const std::set<int>& elements = {});
+/// Says so in the user's language.
+std::string RigidFloorNote(std::size_t members);
