@@ -1,5 +1,5 @@
 // The arguments of pictures and tables of results.
-#include "finiterange.h"
+#include "registerrange.h"
 #include "registershared.h"
 #include "registrations.h"
 #include "view/viewcommands.h"

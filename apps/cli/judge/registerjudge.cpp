@@ -1,6 +1,6 @@
 // The arguments of the judgement.
-#include "finiterange.h"
 #include "judge/judgecommand.h"
+#include "registerrange.h"
 #include "registershared.h"
 #include "registrations.h"
 
