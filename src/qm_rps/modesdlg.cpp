@@ -108,8 +108,18 @@ T_TEXT_TABLE CModesDlg::Table()
     return table;
 }
 
+std::string CModesDlg::PushesText() const
+{
+    std::string names;
+    for (const auto& [key, push] : m_doc.Data().Model().pushovers)
+        if (NamesAMode(push)) names += (names.empty() ? "" : ", ") + push.name;
+    return names.empty() ? names : Say("IDS_QM_MODES_NAMED", names);
+}
+
 std::string CModesDlg::NotesText() const
 {
+    const std::string pushes = PushesText();
     return Say("IDS_QM_MODES_COUNT", std::to_string(m_doc.Data().Model().modes.size()),
-               std::to_string(m_doc.Data().Model().storeys.size()));
+               std::to_string(m_doc.Data().Model().storeys.size())) +
+           (pushes.empty() ? "" : "\n" + pushes);
 }

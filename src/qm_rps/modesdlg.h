@@ -38,6 +38,9 @@ public:
     /// Number, period, and per cent of the mass along X, Y and Z: a row each.
     T_TEXT_TABLE Table();
     std::string NotesText() const;
+    /// Which pushover load cases name modes by number: modes that are found anew may change under
+    /// them. Empty: none does.
+    std::string PushesText() const;
 
 private:
     int Refuse(const char* key, const std::string& text);

@@ -128,5 +128,7 @@ EXIT_CODE RunModes(const T_MODES_OPTIONS& o)
         rows.front().push_back(column.head);
     rows.insert(rows.end(), modes.rows.begin(), modes.rows.end());
     std::printf("%s", TableText(rows).c_str());
+    if (const std::string pushes = dialog.PushesText(); o.find > 0 && !pushes.empty())
+        std::fprintf(stderr, "%s\n", pushes.c_str());
     return EXIT_CODE::Done;
 }

@@ -82,8 +82,8 @@ int CheckBuilding(const T_BUILDING& in, T_FINDING& fault)
                          static_cast<double>(in.baysY.size() + 1) *
                          static_cast<double>(in.storeys.size() + 1);
     if (nodes > kMostNodes)
-        return CreateFault(fault, "storeys", "IDS_QM_NEW_MANY_NODES", ShortestText(nodes),
-                           ShortestText(kMostNodes));
+        return CreateFault(fault, "storeys", "IDS_QM_NEW_MANY_NODES", FormatText("%.0f", nodes),
+                           FormatText("%.0f", kMostNodes));
     if (in.baysY.empty() && in.loaded == LOADED_BEAMS::AlongY)
         return CreateFault(fault, "loaded", "IDS_QM_NEW_NO_Y_BEAMS");
     return 1;

@@ -297,11 +297,14 @@ TEST(Modes, ATypedShapeHasItsMassAndAnEditOfItsOwn)
     T_CURVE_FACTS facts;
     T_FINDING fault;
     ASSERT_TRUE(MakeCurveCase(ThreeStoreys(), content, facts, fault));
+    doc.Data().Assign(content); // its push PX names mode 1
+    EXPECT_NE(std::string::npos, CModesDlg(doc).NotesText().find("name modes: PX."));
     content.model.pushovers.clear();
     content.model.evaluations.clear();
     content.results.clear();
     doc.Data().Assign(content);
     CModesDlg dialog(doc);
+    EXPECT_EQ("", dialog.PushesText());
     dialog.m_period = 0.2;
     for (const char* const shape : {"1, 1", "0, 0, 0", "1, a, 1"}) {
         dialog.m_shape = shape;
