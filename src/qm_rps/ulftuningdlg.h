@@ -27,8 +27,8 @@ public:
     std::size_t Unknowns() const { return m_unknowns.size(); }
     const std::string& NameOf(std::size_t unknown) const;
     double Factor(std::size_t unknown) const { return m_factors.at(unknown); }
-    /// More scales no load of a bridge: forces of such a factor lose their digits.
-    static constexpr double kMostFactor = 1e6;
+    /// Start forces of 1 N make factors of millions; far beyond, sums of forces lose their digits.
+    static constexpr double kMostFactor = 1e12;
     /// 1 taken; 0 not finite, beyond kMostFactor, or there is no such unknown.
     [[nodiscard]] int OnFactor(std::size_t unknown, double factor);
     int m_chosen = 0; // the unknown that the slider moves
