@@ -19,9 +19,9 @@ public:
     using Texts = std::map<std::string, std::string, std::less<>>;
 
     /// Reads a catalogue file. Blanks around key and text are dropped; a text in double quotes
-    /// keeps the blanks inside. Escapes \n \t \\ . Returns what is wrong, line by line: a line
-    /// that is no entry, an empty text, an unknown escape, a key that stands twice (the first
-    /// text counts). Everything else is taken.
+    /// keeps the blanks inside. Escapes are those of C for line, tab and backslash. Returns what is
+    /// wrong, line by line: a line that is no entry, an empty text, an unknown escape, a key that
+    /// stands twice (the first text counts). Everything else is taken.
     std::vector<T_CATALOGUE_FAULT> Read(std::string_view fileText);
 
     /// Text of the key, or null.

@@ -19,10 +19,10 @@ public:
     /// Replaces or adds the results of one static load case; null removes them.
     void SetStaticResult(int loadCase, std::shared_ptr<IStaticResult> result);
 
-    /// Puts the runs of one pushover load case, one for each turn of its loads, in place of all
-    /// that it has; results of another solver go when there is one that is not turned.
     /// The first record that a file could not hold, in words; empty: all can.
     std::string Fault() const;
+    /// Puts the runs of one pushover load case, one for each turn of its loads, in place of all
+    /// that it has; results of another solver go when there is one that is not turned.
     void SetPushRuns(int pushover, const std::vector<std::shared_ptr<IPushRun>>& runs);
 
     /// Results of the construction stages; null where there are none.

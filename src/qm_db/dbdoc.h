@@ -14,6 +14,7 @@
 #include <cstdint>
 #include <optional>
 
+/// A model in memory with its controllers, which live as long as it does.
 class CDBDoc {
 public:
     CDBDoc();
@@ -24,16 +25,22 @@ public:
     /// The current document, or null. A document is current from its making until it ends or
     /// another one is made current.
     static CDBDoc* GetDocPoint();
+    /// Makes a document the current one; null: none is.
     static void SetDocPoint(CDBDoc* doc);
 
+    /// The records in SI, and whether they are saved.
     CDataCtrl& Data() { return m_data; }
     const CDataCtrl& Data() const { return m_data; }
+    /// Records in current units.
     CAttrCtrl& Attr() { return m_attr; }
+    /// Results in current units.
     CPostCtrl& Post() { return m_post; }
+    /// Current units and conversions.
     CUnitCtrl& Unit() { return m_unit; }
     CInitCtrl& Init() { return m_init; }
     CDBLib& Lib() { return m_lib; }
     CMembCtrl& Memb() { return m_memb; }
+    /// Edits that can be taken back.
     CUndoCtrl& Undo() { return m_undo; }
     CEditData& Edit() { return m_edit; }
     CDynModuleMgr& DynModules() { return m_modules; }
@@ -48,11 +55,14 @@ public:
     /// error filled: the copy can't be read, or another program has the file open.
     [[nodiscard]] int RecoverModel(const std::string& copy, const std::string& path,
                                    T_FILE_ERROR& error);
+    /// Reads a case file and the recorder files that it names. 1 done; 0 error filled, the document
+    /// as it was.
     [[nodiscard]] int ImportCase(const std::string& path, T_FILE_ERROR& error);
     /// Saves to the file it was opened from, or to another one. 1 done; 0 error filled, the file
     /// on disk as it was: also when another program has changed it meanwhile (fault Changed).
     [[nodiscard]] int SaveModel(T_FILE_ERROR& error);
     [[nodiscard]] int SaveModelAs(const std::string& path, T_FILE_ERROR& error);
+    /// Writes a case file; the document keeps its path. 1 done; 0 error filled, as above.
     [[nodiscard]] int ExportCase(const std::string& path, T_FILE_ERROR& error) const;
 
     /// Saves as a model file (.qmdb) or as a case file (.json); the document then belongs to that

@@ -12,11 +12,11 @@
 
 /// Modal participation factors, one per direction X, Y, Z, RX, RY, RZ.
 struct T_MPAF_D {
-    T_DOF6 factor{};
+    T_DOF6 factor{}; // of the normalisation of the mode's shape
 };
 /// Effective modal masses in per cent of the direction's total.
 struct T_MPAM_D {
-    T_DOF6 percent{};
+    T_DOF6 percent{}; // 0 to 100
 };
 
 /// Limit-state steps of the pushover load cases, kept with the model.
@@ -31,12 +31,14 @@ public:
     void SetStepNTC2008(int loadCase, int stepSLD, int stepSLV, int stepSLC);
     /// 1 stored steps exist; 0 none, outputs as they were.
     [[nodiscard]] int GetStepEC8(int loadCase, std::array<int, 3>& out) const;
+    /// The same of NTC: SLD, SLV, SLC.
     [[nodiscard]] int GetStepNTC2008(int loadCase, std::array<int, 3>& out) const;
 
 private:
     CDataCtrl& m_data;
 };
 
+/// Results of the document: modes, pushover steps, static and stage results, in current units.
 class CPostCtrl {
 public:
     explicit CPostCtrl(CDataCtrl& data)
@@ -44,6 +46,7 @@ public:
     {
     }
 
+    /// Never null; lives as long as this object.
     CPoverInfo* GetPoverInfo() { return &m_poverInfo; }
 
     /// Number of eigen modes; modes count from 1.
@@ -62,6 +65,7 @@ public:
     /// Selects the pushover load case whose steps are read; its run with the loads turned so many
     /// times by its static angle. 1 done; 0 it has no such results.
     [[nodiscard]] int SelectPushover(int loadCase, int turn = 0);
+    /// Steps of the selected pushover load case; 0 without results.
     int GetStepCount() const;
     /// Steps count from 1. 1 done; 0 out of range.
     [[nodiscard]] int SelectStep(int step);
@@ -70,6 +74,7 @@ public:
     [[nodiscard]] int GetStepFactor_PO(double& factor);
     [[nodiscard]] int GetReacNew(double& reaction);
     [[nodiscard]] int GetDispNew(int node, double& displacement);
+    /// Whether the node has results in the selected pushover load case.
     bool ExistNodePost(int node) const;
     /// The node with results that has moved most in the control direction at the last step, the
     /// smallest id of several. 1 found; 0 no steps, or not readable (Error), output as it was.
@@ -133,6 +138,7 @@ public:
     /// 1 the construction stages have results of the model as it is; 0 Error says why not.
     [[nodiscard]] int CheckStagedResult();
 
+    /// Why a read was refused, in the user's language.
     std::string Error() const { return m_error; }
 
     /// Storey drift ratios of a step, largest over the storeys: kind 1 over the storey's vertical

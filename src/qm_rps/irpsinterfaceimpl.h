@@ -3,6 +3,7 @@
 
 #include <string>
 
+/// What the host asks; see IRPSInterfaceImpl.
 class IRPSInterface {
 public:
     IRPSInterface() = default;

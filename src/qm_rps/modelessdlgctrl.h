@@ -12,6 +12,7 @@ class CModelessDlgCtrl : public CDynModule {
 public:
     ~CModelessDlgCtrl() override { CloseAll(); }
 
+    /// In the module registry.
     static constexpr const char* kName = "CModelessDlgCtrl";
     /// The document's controller, made when it is first asked for.
     static CModelessDlgCtrl& Of(CDBDoc& doc);
@@ -20,15 +21,18 @@ public:
     /// have no window of their own to stand over are shown. The view must outlive the document or
     /// be reset to null.
     void SetWindowMaker(CRPSDlgBase::WINDOW_MAKER maker) { m_maker = std::move(maker); }
+    /// Empty: none was installed.
     const CRPSDlgBase::WINDOW_MAKER& WindowMaker() const { return m_maker; }
     void SetView(zql::frx::IDialogView* view) { m_view = view; }
     zql::frx::IDialogView* View() const { return m_view; }
 
     /// The open dialog of that id, or null.
     CRPSDlgBase* Find(int id) const;
+    /// Takes a dialog over, in place of the one of that id.
     CRPSDlgBase& Add(int id, std::unique_ptr<CRPSDlgBase> dialog);
     /// Ends a dialog and its window, as the host does when the person closes it.
     void Close(int id);
+    /// Likewise all of them.
     void CloseAll();
 
 private:

@@ -18,7 +18,8 @@ public:
     /// needs the second one.
     explicit COptDsgn(IUlfResponse& staticSource, IUlfResponse* stageSource = nullptr);
 
-    T_OPT_DUMP m_dump;
+    T_OPT_DUMP m_dump; // where the problem is written as the solver gets it; as made: nowhere
+    /// Another solver than the one of this library.
     void SetSolver(Solver solver) { m_solver = std::move(solver); }
 
     /// 1 factors found; 0 not: key and message say why and the factors are 0. What the run did

@@ -6,6 +6,7 @@
 
 class CPushOverCalcPerfPtFEMA440Base : public CPushOverCalcPerfPtBase {
 public:
+    /// `source` is the file that release assertions name; the owner must outlive the calculator.
     CPushOverCalcPerfPtFEMA440Base(CPushOverPerfPtRecord& owner, const char* source)
         : CPushOverCalcPerfPtBase(owner), m_working(owner), m_source(source)
     {
@@ -23,6 +24,7 @@ public:
                                                               double& A);
 
 protected:
+    /// Raises the release assertion of that line; the calculation goes on.
     void Assert(int line) const;
     /// Warns where the any-type hysteresis model is used outside its period range.
     void WarnAnyType(double T0) const;
@@ -34,9 +36,9 @@ protected:
     /// 5 %-damped spectrum, and the spectrum reduced by B'. 1 done; 0 there is no such value.
     [[nodiscard]] int CalcSecantDamping(double Dp, double Ap, int assertLine, double& betaPct);
 
-    CFema440WorkingSpectrum m_working;
-    double m_T0 = 0.0; // initial period, s
-    T_LOG_RECORD m_log;
+    CFema440WorkingSpectrum m_working; // demand of the trial at hand
+    double m_T0 = 0.0;                 // initial period, s
+    T_LOG_RECORD m_log;                // of the trial at hand
 
 private:
     const char* m_source;

@@ -14,6 +14,7 @@ public:
 
     /// beta1, kappa1, beta2, kappa2, as evaluations keep them.
     void Data2Dlg(const std::array<double, 4>& points);
+    /// In the same order.
     void Dlg2Data(std::array<double, 4>& points) const;
 
     /// Kappa over the hysteretic damping, for a picture: level to beta1, straight to beta2, level

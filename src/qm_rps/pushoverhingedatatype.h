@@ -25,9 +25,12 @@ public:
     /// Chooses another type or component. Edits of the one on show are lost: the person is asked
     /// first. Where the component has no FEMA curve nothing can be edited (IsTaken).
     void OnSelChange(int key, HINGE_COMPONENT component);
+    /// Key of the type on show; 0: none.
     int Key() const { return m_key; }
     HINGE_COMPONENT ComponentOnShow() const { return m_component; }
+    /// Whether the component has a FEMA curve, which can be edited.
     bool IsTaken() const { return m_taken; }
+    /// Whether the negative side of the curve follows the positive one.
     bool IsSymmetric() const;
     T_HINGE_OWNER Owner() const { return {m_type, m_doc.Unit().Units()}; }
     /// The curve as edited, or null.

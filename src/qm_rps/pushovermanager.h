@@ -6,6 +6,7 @@
 /// State: the load case that was chosen last. Lives in the document's module registry.
 class CPushoverManager : public CDynModule {
 public:
+    /// In the module registry.
     static constexpr const char* kName = "CPushoverManager";
     /// That of the current document, made when it is first asked for; null without a document.
     static CPushoverManager* Current();

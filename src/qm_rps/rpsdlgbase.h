@@ -29,11 +29,14 @@ public:
 
     /// The document must outlive the dialog.
     virtual void SetDoc(CDBDoc* doc) { m_doc = doc; }
+    /// Null before SetDoc.
     CDBDoc* Doc() const { return m_doc; }
 
     /// Makes the window. 1 done; 0 it has one, no maker, or the maker made none.
     [[nodiscard]] int Create(const WINDOW_MAKER& maker, int id, zql::frx::IDialogView* parent);
+    /// Brings the window to the front; nothing without one.
     void ShowWindow();
+    /// The window reads everything again; nothing without one.
     void RefreshWindow();
     /// Before the dialog goes: its window reads it to the last.
     void DestroyWindow() { m_window.reset(); }
