@@ -154,7 +154,7 @@ void AddToBash(const T_COMMAND_TEXT& command, std::string& table, std::string& v
         AddToBash(below, table, values);
 }
 
-/// Text in a specification of _arguments or _describe, which is itself between '.
+/// A text within an argument of _arguments or _describe, which stands between single quotes.
 std::string ZshText(std::string_view text)
 {
     std::string out;
